@@ -1,0 +1,78 @@
+#include "LogGenerator/LogGenerator.h"
+
+#include "platform/Clock.h"
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+namespace {
+
+[[noreturn]] void refuse(const char* operation) {
+    throw UnrecognisedOperation(std::string("unrecognised operation: ") + operation);
+}
+
+/// The entry of the state as it is now; it ends at the first value that is missing.
+Dictionary historyEntry(const Dictionary& state, const Clock& clock) {
+    Dictionary entry;
+    for (const std::string_view key : {"DisplayState", "Display", "ExtraInfo"}) {
+        const PropertyList* value = state.find(key);
+        if (value == nullptr || value->isNull()) {
+            return entry;
+        }
+        entry.setFixed(key, value->shallowCopy());
+    }
+    const std::string date = dateText(dateOf(clock.now()));
+    entry.setFixed("Date", date);
+    entry.setFixed("Description", formatText("Snapshot (%@)", {date}));
+    return entry;
+}
+
+} // namespace
+
+LogGenerator::LogGenerator(const GeneratorEnvironment& environment) : _environment(environment) {
+    systemLog(LogPriority::Warning, "Creating Log object: %p", static_cast<const void*>(this));
+}
+
+void LogGenerator::updateState(Dictionary& /*state*/, Bytes /*data*/) {
+    refuse("updateState:withData:");
+}
+
+PropertyList LogGenerator::generateLogUsingState(Dictionary& /*state*/) {
+    refuse("generateLogUsingState:");
+}
+
+PropertyList LogGenerator::getStartCommand() const {
+    refuse("getStartCommand");
+}
+
+PropertyList LogGenerator::getSaveContentsFromState(const Dictionary& /*state*/) const {
+    refuse("getSaveContentsFromState:");
+}
+
+void LogGenerator::updateHistoryInState(Dictionary& state, const Clock& clock) {
+    const PropertyList* found = state.find("History");
+    ArrayRef history = found != nullptr ? found->array() : nullptr;
+    if (history == nullptr) {
+        history = std::make_shared<Array>();
+        state.setFixed("History", history);
+    } else if (history->size() >= kHistoryLength) {
+        const auto surplus = history->size() - (kHistoryLength - 1);
+        history->erase(history->begin(), history->begin() + static_cast<std::ptrdiff_t>(surplus));
+    }
+    history->emplace_back(historyEntry(state, clock));
+}
+
+std::unique_ptr<LogGenerator>
+LogGenerator::generatorFromTechnology(const PropertyList& technology,
+                                      std::span<const Technology> technologies,
+                                      const GeneratorEnvironment& environment) {
+    const auto identifier = technology.string();
+    for (const Technology& row : technologies) {
+        if (identifier == row.identifier) {
+            return row.generator(environment);
+        }
+    }
+    return nullptr;
+}
+
+} // namespace pallax

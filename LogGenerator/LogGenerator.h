@@ -1,0 +1,81 @@
+#pragma once
+
+#include "platform/Bytes.h"
+#include "platform/PropertyList.h"
+
+#include <memory>
+#include <span>
+#include <stdexcept>
+#include <string_view>
+
+namespace pallax {
+
+class Bundle;
+class Clock;
+class LogGenerator;
+class Resources;
+
+/// What a generator needs of its surroundings. All of it outlives the generator.
+struct GeneratorEnvironment {
+    const Clock& clock;         ///< history dates, the DLF's time stamp
+    const Resources& resources; ///< display templates
+    const Bundle& bundle;       ///< the DLF's application text and build date
+};
+
+/// Thrown by an abstract operation that a subclass has not overridden: a programming error.
+class UnrecognisedOperation : public std::logic_error {
+public:
+    using std::logic_error::logic_error;
+};
+
+/// One row of the technology table: what the modem answers, and who speaks it.
+struct Technology {
+    std::string_view identifier;
+    std::unique_ptr<LogGenerator> (*generator)(const GeneratorEnvironment& environment);
+};
+
+/// The abstract base of every per-technology generator: turns log packets into a display
+/// dictionary and a save record, always working on the state dictionary that the model owns.
+///
+/// The state's keys: "Template" (the display template as loaded), "Display" (the live display),
+/// "ExtraInfo", "DisplayState" (data: what was received since the previous display generation)
+/// and "History" (array of at most 5 entries, oldest first).
+class LogGenerator {
+public:
+    static constexpr std::size_t kHistoryLength = 5;
+
+    explicit LogGenerator(const GeneratorEnvironment& environment);
+    virtual ~LogGenerator() = default;
+    LogGenerator(const LogGenerator&) = delete;
+    LogGenerator& operator=(const LogGenerator&) = delete;
+
+    /// One message from the log channel; an empty one counts as null. A record that throws lets
+    /// its exception leave, and the packet is then not captured.
+    virtual void updateState(Dictionary& state, Bytes data);
+    /// The display dictionary, or null when there is none yet. Rotates history and raw capture.
+    virtual PropertyList generateLogUsingState(Dictionary& state);
+    /// The property-list dictionary that starts the modem's stream.
+    virtual PropertyList getStartCommand() const;
+    /// History entries and what else a snapshot file carries: an array.
+    virtual PropertyList getSaveContentsFromState(const Dictionary& state) const;
+
+    /// Appends the current display to the state's history, of which the newest 5 stay. An entry
+    /// is a dictionary of "DisplayState", "Display", "ExtraInfo" (one-level copies), "Date" and
+    /// "Description"; a missing value ends it there.
+    static void updateHistoryInState(Dictionary& state, const Clock& clock);
+
+    /// A new generator of the first technology in `technologies` whose identifier equals
+    /// `technology`, or null.
+    static std::unique_ptr<LogGenerator>
+    generatorFromTechnology(const PropertyList& technology,
+                            std::span<const Technology> technologies,
+                            const GeneratorEnvironment& environment);
+
+protected:
+    const GeneratorEnvironment& environment() const { return _environment; }
+
+private:
+    GeneratorEnvironment _environment;
+};
+
+} // namespace pallax

@@ -1,0 +1,42 @@
+# How a folder of this project becomes a target. Warnings and language level are
+# set per target, so that no flag leaks into what a target links.
+
+add_library(pallax_options INTERFACE)
+target_compile_features(pallax_options INTERFACE cxx_std_20)
+target_compile_options(pallax_options INTERFACE
+    -Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror
+)
+target_include_directories(pallax_options INTERFACE ${PROJECT_SOURCE_DIR})
+if(PALLAX_SANITIZE)
+    # -Wno-maybe-uninitialized: the sanitizers' instrumentation makes g++ 12 see ghosts.
+    target_compile_options(pallax_options INTERFACE
+        -fsanitize=${PALLAX_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer
+        $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>
+    )
+    target_link_options(pallax_options INTERFACE -fsanitize=${PALLAX_SANITIZE})
+endif()
+if(PALLAX_BUILD_FUZZERS)
+    target_compile_options(pallax_options INTERFACE
+        -fsanitize=fuzzer-no-link,address,undefined -fno-sanitize-recover=all
+    )
+    target_link_options(pallax_options INTERFACE -fsanitize=address,undefined)
+endif()
+
+# pallax_library(NAME SOURCES file... [LINKS library...])
+# One folder, one static library, linking only what lies below it.
+function(pallax_library name)
+    cmake_parse_arguments(ARG "" "" "SOURCES;LINKS" ${ARGN})
+    add_library(${name} STATIC ${ARG_SOURCES})
+    target_link_libraries(${name} PUBLIC pallax_options ${ARG_LINKS})
+endfunction()
+
+# pallax_bundle(NAME library...): one static archive made of several.
+function(pallax_bundle name)
+    set(objects "")
+    foreach(library IN LISTS ARGN)
+        list(APPEND objects $<TARGET_OBJECTS:${library}>)
+    endforeach()
+    add_library(${name} STATIC ${objects})
+    set_target_properties(${name} PROPERTIES LINKER_LANGUAGE CXX)
+    target_link_libraries(${name} PUBLIC pallax_options pugixml::pugixml)
+endfunction()

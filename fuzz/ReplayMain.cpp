@@ -1,0 +1,54 @@
+// Runs a fuzz target over every file of a corpus folder, each also cut at every length (long
+// files at some lengths), so that the corpus is a test wherever the fuzzer is not.
+
+#include <algorithm>
+#include <cstddef>
+#include <cstdint>
+#include <cstdio>
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <vector>
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size);
+
+namespace {
+
+std::vector<std::uint8_t> contentOf(const std::filesystem::path& path) {
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+}
+
+void replay(const std::vector<std::uint8_t>& content) {
+    constexpr std::size_t kMostCuts = 400;
+    const std::size_t step = std::max<std::size_t>(1, content.size() / kMostCuts);
+    for (std::size_t length = 0; length < content.size(); length += step) {
+        // A copy of its own, so that a sanitizer sees a read past the cut.
+        const std::vector<std::uint8_t> cut(content.begin(),
+                                            content.begin() + static_cast<std::ptrdiff_t>(length));
+        (void)LLVMFuzzerTestOneInput(cut.data(), cut.size());
+    }
+    (void)LLVMFuzzerTestOneInput(content.data(), content.size());
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    if (argc != 2) {
+        (void)std::fprintf(stderr, "usage: %s CORPUS-FOLDER\n", argv[0]);
+        return 2;
+    }
+    std::size_t count = 0;
+    for (const auto& entry : std::filesystem::recursive_directory_iterator(argv[1])) {
+        if (entry.is_regular_file()) {
+            replay(contentOf(entry.path()));
+            ++count;
+        }
+    }
+    if (count == 0) {
+        (void)std::fprintf(stderr, "%s holds no file\n", argv[1]);
+        return 1;
+    }
+    (void)std::printf("%zu files replayed\n", count);
+    return 0;
+}

@@ -1,0 +1,66 @@
+#pragma once
+
+#include "platform/Bytes.h"
+#include "platform/Date.h"
+#include "platform/Result.h"
+
+#include <cstddef>
+#include <memory>
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+
+namespace pallax {
+
+/// What a radio modem's recording can be of, told by its link type; the identifier is the one
+/// that the telephony service answers GetTechnology with.
+struct RecordedTechnology {
+    int linkType;                 ///< 147 … 151
+    std::string_view identifier;  ///< "Zorell_GSM"
+    std::string_view commandName; ///< "gsm", as the command line says it
+};
+
+/// The five known technologies, by link type.
+std::span<const RecordedTechnology> recordedTechnologies();
+const RecordedTechnology* technologyOfLinkType(int linkType);
+const RecordedTechnology* technologyOfCommandName(std::string_view name);
+
+/// One packet of a recording, exactly as the log channel delivered it.
+struct RecordedPacket {
+    Time time;
+    Bytes data; ///< valid until the next call
+};
+
+/// Why a recording cannot be opened or read on: one clear sentence that names the file.
+struct RecordingError {
+    enum class Kind { CannotOpen, NoCapture, Empty, UnknownLinkType, CutShort, Unreadable };
+    Kind kind;
+    std::string sentence;
+};
+
+/// A recording that is read packet by packet: pcap or pcapng, microsecond or nanosecond stamps.
+class Recording {
+public:
+    using OpenResult = Result<std::unique_ptr<Recording>, RecordingError>;
+
+    /// `path` "-" is standard input. A file of zero bytes is Empty, anything else that is no
+    /// capture is NoCapture. A capture without packets is no error.
+    static OpenResult open(const std::string& path);
+
+    virtual ~Recording() = default;
+    virtual const std::string& name() const = 0; ///< as given; "standard input" for "-"
+    virtual int linkType() const = 0;
+    /// Null for a link type that is none of the five; whoever has been told the technology by
+    /// other means (an option) need not care.
+    virtual const RecordedTechnology* technology() const = 0;
+    /// The sentence for a foreign link type: names the file, the number and the five known ones.
+    virtual RecordingError foreignLinkType() const = 0;
+    /// The next packet; nothing at the end, or when `error` has something to say.
+    virtual std::optional<RecordedPacket> next() = 0;
+    /// Set once `next` has given nothing because the recording is cut in the middle of a packet,
+    /// or cannot be read on.
+    virtual const std::optional<RecordingError>& error() const = 0;
+};
+
+} // namespace pallax

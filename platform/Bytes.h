@@ -1,0 +1,19 @@
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <span>
+#include <vector>
+
+namespace pallax {
+
+/// Bytes that somebody else owns. A null message is an empty span.
+using Bytes = std::span<const std::uint8_t>;
+
+/// Bytes that we own.
+using ByteBuffer = std::vector<std::uint8_t>;
+
+/// Immutable bytes shared by several owners (a property list's data value).
+using SharedBytes = std::shared_ptr<const ByteBuffer>;
+
+} // namespace pallax

@@ -1,0 +1,19 @@
+#pragma once
+
+#include <chrono>
+#include <functional>
+
+namespace pallax {
+
+/// The main dispatch queue. Blocks run one at a time, on the main thread, in the order in which
+/// they were posted or fell due. An exception leaves through whoever runs the queue.
+class MainQueue {
+public:
+    using Block = std::function<void()>;
+
+    virtual ~MainQueue() = default;
+    virtual void async(Block block) = 0;
+    virtual void after(std::chrono::nanoseconds delay, Block block) = 0;
+};
+
+} // namespace pallax

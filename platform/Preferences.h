@@ -1,0 +1,21 @@
+#pragma once
+
+#include "platform/PropertyList.h"
+
+#include <string_view>
+
+namespace pallax {
+
+/// The preferences store: one set of keys per application domain.
+class Preferences {
+public:
+    virtual ~Preferences() = default;
+    virtual void setValue(std::string_view key, const PropertyList& value,
+                          std::string_view domain) = 0;
+    /// Makes the domain's values durable; false when that failed.
+    virtual bool synchronize(std::string_view domain) = 0;
+    /// Tells whoever listens that the key has changed.
+    virtual void postChangedNotice(std::string_view domain, std::string_view key) = 0;
+};
+
+} // namespace pallax

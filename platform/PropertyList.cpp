@@ -1,0 +1,277 @@
+#include "platform/PropertyList.h"
+
+#include "platform/Format.h"
+
+#include <array>
+#include <cmath>
+#include <limits>
+
+namespace pallax {
+
+namespace {
+
+// Up to this many entries a linear search beats hashing; sections have at most about 20.
+constexpr std::size_t kIndexedFrom = 32;
+
+bool equalStrings(const PropertyList& a, const PropertyList& b) {
+    const DisplayNumber* left = a.displayNumber();
+    const DisplayNumber* right = b.displayNumber();
+    if (left != nullptr && right != nullptr && left->sameNumberAndFormat(*right)) {
+        return true;
+    }
+    return a.string() == b.string();
+}
+
+bool equalDictionaries(const Dictionary& a, const Dictionary& b) {
+    if (a.size() != b.size()) {
+        return false;
+    }
+    for (const Dictionary::Entry& entry : a) {
+        const PropertyList* other = entry.hasStringKey ? b.find(entry.key.view()) : nullptr;
+        if (other == nullptr || !(entry.value == *other)) {
+            return false;
+        }
+    }
+    return true;
+}
+
+template <class Container, class Append>
+void describeAll(std::string& out, const Container& container, std::string_view open,
+                 std::string_view close, const Append& append) {
+    out += open;
+    bool first = true;
+    for (const auto& element : container) {
+        out += first ? " " : "";
+        append(element, first);
+        first = false;
+    }
+    out += first ? "" : " ";
+    out += close;
+}
+
+void describe(std::string& out, const PropertyList& object) {
+    if (object.appendString(out)) {
+        return;
+    }
+    if (const DictionaryRef dictionary = object.dictionary()) {
+        describeAll(out, *dictionary, "{", "}", [&](const Dictionary::Entry& entry, bool first) {
+            out += first ? "" : " ";
+            out += entry.key.view();
+            out += " = ";
+            describe(out, entry.value);
+            out += ';';
+        });
+    } else if (const ArrayRef array = object.array()) {
+        describeAll(out, *array, "(", ")", [&](const PropertyList& element, bool first) {
+            out += first ? "" : ", ";
+            describe(out, element);
+        });
+    } else if (const SharedBytes data = object.data()) {
+        out += dumpOf(data->data(), data->size());
+    } else if (const auto date = object.date()) {
+        out += dateText(*date);
+    } else if (const auto integer = object.integer()) {
+        out += std::to_string(*integer);
+    } else if (const auto real = object.real()) {
+        out += formatText("%f", {*real});
+    } else if (const auto truth = object.boolean()) {
+        out += *truth ? "true" : "false";
+    } else {
+        out += "(null)";
+    }
+}
+
+} // namespace
+
+PropertyList::PropertyList(Array elements) : _value(std::make_shared<Array>(std::move(elements))) {}
+
+PropertyList::PropertyList(Dictionary entries)
+    : _value(std::make_shared<Dictionary>(std::move(entries))) {}
+
+PropertyList PropertyList::data(ByteBuffer bytes) {
+    return {std::make_shared<const ByteBuffer>(std::move(bytes))};
+}
+
+PropertyList::Type PropertyList::type() const {
+    constexpr std::array kTypes = {Type::kNull,  Type::kString,    Type::kString, Type::kInteger,
+                                   Type::kReal,  Type::kBoolean,   Type::kData,   Type::kDate,
+                                   Type::kArray, Type::kDictionary};
+    static_assert(kTypes.size() == std::variant_size_v<Value>);
+    return kTypes.at(_value.index());
+}
+
+std::string_view PropertyList::typeName() const {
+    constexpr std::array<std::string_view, 9> kNames = {
+        "null", "string", "integer", "real", "boolean", "data", "date", "array", "dictionary"};
+    return kNames.at(static_cast<std::size_t>(type()));
+}
+
+std::optional<std::string> PropertyList::string() const {
+    std::string out;
+    return appendString(out) ? std::optional<std::string>(std::move(out)) : std::nullopt;
+}
+
+bool PropertyList::appendString(std::string& out) const {
+    if (const auto* text = std::get_if<Text>(&_value)) {
+        out += text->view();
+        return true;
+    }
+    if (const auto* number = std::get_if<DisplayNumber>(&_value)) {
+        number->appendText(out);
+        return true;
+    }
+    return false;
+}
+
+SharedBytes PropertyList::data() const {
+    const auto* data = std::get_if<SharedBytes>(&_value);
+    return data != nullptr ? *data : nullptr;
+}
+
+ArrayRef PropertyList::array() const {
+    const auto* array = std::get_if<ArrayRef>(&_value);
+    return array != nullptr ? *array : nullptr;
+}
+
+DictionaryRef PropertyList::dictionary() const {
+    const auto* dictionary = std::get_if<DictionaryRef>(&_value);
+    return dictionary != nullptr ? *dictionary : nullptr;
+}
+
+std::optional<std::int32_t> PropertyList::int32() const {
+    constexpr auto kLeast = std::numeric_limits<std::int32_t>::min();
+    constexpr auto kLargest = std::numeric_limits<std::int32_t>::max();
+    if (const auto number = integer()) {
+        if (*number >= kLeast && *number <= kLargest) {
+            return static_cast<std::int32_t>(*number);
+        }
+    } else if (const auto whole = real()) {
+        if (*whole >= kLeast && *whole <= kLargest && std::trunc(*whole) == *whole) {
+            return static_cast<std::int32_t>(*whole);
+        }
+    }
+    return std::nullopt;
+}
+
+PropertyList PropertyList::shallowCopy() const {
+    if (const ArrayRef elements = array()) {
+        return Array(*elements);
+    }
+    if (const DictionaryRef entries = dictionary()) {
+        return Dictionary(*entries);
+    }
+    return *this;
+}
+
+std::string PropertyList::description() const {
+    std::string out;
+    describe(out, *this);
+    return out;
+}
+
+bool operator==(const PropertyList& a, const PropertyList& b) {
+    if (a.type() != b.type()) {
+        return false;
+    }
+    switch (a.type()) {
+    case PropertyList::Type::kString:
+        return equalStrings(a, b);
+    case PropertyList::Type::kData:
+        return *a.data() == *b.data();
+    case PropertyList::Type::kArray:
+        return *a.array() == *b.array();
+    case PropertyList::Type::kDictionary:
+        return equalDictionaries(*a.dictionary(), *b.dictionary());
+    default:
+        return a._value == b._value;
+    }
+}
+
+Dictionary::Dictionary(std::initializer_list<std::pair<const char*, PropertyList>> entries) {
+    reserve(entries.size());
+    for (const auto& [key, value] : entries) {
+        set(key, value);
+    }
+}
+
+std::size_t Dictionary::indexOf(std::string_view key) const {
+    if (_entries.size() >= kIndexedFrom) {
+        const auto found = _index.find(key);
+        return found != _index.end() ? found->second : kNotFound;
+    }
+    for (std::size_t at = 0; at < _entries.size(); ++at) {
+        if (_entries[at].key.view() == key && _entries[at].hasStringKey) {
+            return at;
+        }
+    }
+    return kNotFound;
+}
+
+const PropertyList* Dictionary::find(std::string_view key) const {
+    const std::size_t at = indexOf(key);
+    return at != kNotFound ? &_entries[at].value : nullptr;
+}
+
+void Dictionary::append(Entry entry) {
+    _entries.push_back(std::move(entry));
+    if (_entries.size() == kIndexedFrom) {
+        rebuildIndex();
+    } else if (_entries.size() > kIndexedFrom && _entries.back().hasStringKey) {
+        _index.emplace(_entries.back().key.view(), _entries.size() - 1);
+    }
+}
+
+void Dictionary::set(Text key, PropertyList value) {
+    const std::size_t at = indexOf(key.view());
+    if (at != kNotFound) {
+        _entries[at].value = std::move(value);
+    } else {
+        append({std::move(key), std::move(value)});
+    }
+}
+
+void Dictionary::setFixed(std::string_view key, PropertyList value) {
+    set(Text::fixed(key), std::move(value));
+}
+
+void Dictionary::appendForeignKey(const PropertyList& key, PropertyList value) {
+    append({key.description(), std::move(value), false});
+}
+
+bool Dictionary::remove(std::string_view key) {
+    const std::size_t at = indexOf(key);
+    if (at == kNotFound) {
+        return false;
+    }
+    _entries.erase(_entries.begin() + static_cast<std::ptrdiff_t>(at));
+    rebuildIndex();
+    return true;
+}
+
+void Dictionary::rebuildIndex() {
+    _index.clear();
+    if (_entries.size() < kIndexedFrom) {
+        return;
+    }
+    for (std::size_t at = 0; at < _entries.size(); ++at) {
+        if (_entries[at].hasStringKey) {
+            _index.emplace(_entries[at].key.view(), at);
+        }
+    }
+}
+
+bool sameInOrder(const Dictionary& a, const Dictionary& b) {
+    if (a.size() != b.size()) {
+        return false;
+    }
+    auto other = b.begin();
+    for (const Dictionary::Entry& entry : a) {
+        if (!(entry.key == other->key) || !(entry.value == other->value)) {
+            return false;
+        }
+        ++other;
+    }
+    return true;
+}
+
+} // namespace pallax

@@ -1,0 +1,162 @@
+#pragma once
+
+#include "platform/Bytes.h"
+#include "platform/Date.h"
+#include "platform/NumberFormat.h"
+#include "platform/Text.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <initializer_list>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <utility>
+#include <variant>
+#include <vector>
+
+namespace pallax {
+
+class PropertyList;
+class Dictionary;
+
+using Array = std::vector<PropertyList>;
+using ArrayRef = std::shared_ptr<Array>;
+using DictionaryRef = std::shared_ptr<Dictionary>;
+
+/// The typed tree that the whole system exchanges: commands, templates, displays, state,
+/// injected records and snapshot files.
+///
+/// Copying shares arrays and dictionaries: two copies see each other's changes to a container.
+/// A string may be a display number (a number with its format); to every reader it is a string
+/// like any other, whose text is made when it is asked for.
+class PropertyList {
+public:
+    // With a "k", for the plain names are the types themselves.
+    enum class Type {
+        kNull,
+        kString,
+        kInteger,
+        kReal,
+        kBoolean,
+        kData,
+        kDate,
+        kArray,
+        kDictionary
+    };
+
+    PropertyList() = default;
+    PropertyList(Text text) : _value(std::move(text)) {}
+    PropertyList(std::string text) : _value(Text(std::move(text))) {}
+    PropertyList(const char* text) : _value(Text(text)) {}
+    PropertyList(DisplayNumber number) : _value(number) {}
+    PropertyList(SharedBytes data) : _value(std::move(data)) {}
+    PropertyList(Date date) : _value(date) {}
+    PropertyList(ArrayRef array) : _value(std::move(array)) {}
+    PropertyList(DictionaryRef dictionary) : _value(std::move(dictionary)) {}
+    PropertyList(Array elements);
+    PropertyList(Dictionary entries);
+
+    static PropertyList integer(std::int64_t number) { return PropertyList(Value(number)); }
+    static PropertyList real(double number) { return PropertyList(Value(number)); }
+    static PropertyList boolean(bool truth) { return PropertyList(Value(truth)); }
+    static PropertyList data(ByteBuffer bytes);
+
+    Type type() const;
+    /// The type's name as a diagnostic gives it: "string", "integer", "dictionary", …
+    std::string_view typeName() const;
+    bool isNull() const { return type() == Type::kNull; }
+    bool isString() const { return type() == Type::kString; }
+
+    /// The text of a string; nothing for any other type.
+    std::optional<std::string> string() const;
+    /// Appends the text of a string; false (and nothing appended) for any other type.
+    bool appendString(std::string& out) const;
+    /// The number behind a display string, or null for everything else.
+    const DisplayNumber* displayNumber() const { return std::get_if<DisplayNumber>(&_value); }
+
+    std::optional<std::int64_t> integer() const { return get<std::int64_t>(); }
+    std::optional<double> real() const { return get<double>(); }
+    std::optional<bool> boolean() const { return get<bool>(); }
+    std::optional<Date> date() const { return get<Date>(); }
+    SharedBytes data() const;         ///< null when this is no data value
+    ArrayRef array() const;           ///< null when this is no array
+    DictionaryRef dictionary() const; ///< null when this is no dictionary
+
+    /// The number as a signed 32-bit integer: an integer in range, or a real with a whole value
+    /// in range; nothing otherwise. A string is no number, whatever it reads.
+    std::optional<std::int32_t> int32() const;
+
+    /// A one-level copy: a new container that shares its elements; everything else is itself.
+    PropertyList shallowCopy() const;
+
+    /// One readable line for log texts: { key = value; }, ( a, b ), <01ff>.
+    std::string description() const;
+
+    /// The property-list equality test: same type, same content, at every depth; strings by
+    /// their text, dictionaries whatever their order.
+    friend bool operator==(const PropertyList& a, const PropertyList& b);
+
+private:
+    using Value = std::variant<std::monostate, Text, DisplayNumber, std::int64_t, double, bool,
+                               SharedBytes, Date, ArrayRef, DictionaryRef>;
+    explicit PropertyList(Value value) : _value(std::move(value)) {}
+
+    template <class T>
+    std::optional<T> get() const {
+        const T* value = std::get_if<T>(&_value);
+        return value != nullptr ? std::optional<T>(*value) : std::nullopt;
+    }
+
+    Value _value;
+};
+
+/// String keys to values, in the order in which the keys were first set.
+class Dictionary {
+public:
+    struct Entry {
+        Text key;
+        PropertyList value;
+        /// False for an entry whose key was no string in the source (`key` is its printed form):
+        /// only a walk over the entries meets it.
+        bool hasStringKey = true;
+    };
+
+    Dictionary() = default;
+    Dictionary(std::initializer_list<std::pair<const char*, PropertyList>> entries);
+
+    /// The value under `key`, or null. The pointer is valid until the next change.
+    const PropertyList* find(std::string_view key) const;
+    bool contains(std::string_view key) const { return find(key) != nullptr; }
+
+    /// Replaces the value under `key` where it stands, or appends.
+    void set(Text key, PropertyList value);
+    /// The same for a key with static storage duration; allocates no key.
+    void setFixed(std::string_view key, PropertyList value);
+    void appendForeignKey(const PropertyList& key, PropertyList value);
+    /// True when there was something to remove.
+    bool remove(std::string_view key);
+
+    void reserve(std::size_t count) { _entries.reserve(count); }
+    std::size_t size() const { return _entries.size(); }
+    bool empty() const { return _entries.empty(); }
+    auto begin() const { return _entries.begin(); }
+    auto end() const { return _entries.end(); }
+
+private:
+    static constexpr std::size_t kNotFound = static_cast<std::size_t>(-1);
+    std::size_t indexOf(std::string_view key) const;
+    void append(Entry entry);
+    void rebuildIndex();
+
+    std::vector<Entry> _entries;
+    /// Kept once a linear search would be slow; the views point into the entries' keys.
+    std::unordered_map<std::string_view, std::size_t> _index;
+};
+
+/// The same order of keys and the same values; what tests of "in this order" compare.
+bool sameInOrder(const Dictionary& a, const Dictionary& b);
+
+} // namespace pallax

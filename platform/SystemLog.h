@@ -1,0 +1,55 @@
+#pragma once
+
+#include "platform/Format.h"
+
+#include <string_view>
+
+namespace pallax {
+
+/// The priorities of the system log, as syslog numbers them.
+enum class LogPriority : int {
+    Error = 3,
+    Warning = 4,
+    Notice = 5,
+    Informational = 6,
+    /// The raw value that the DLF writer logs its failures with; its level (its low three bits)
+    /// is 0, the most urgent one.
+    DlfFailure = 16,
+};
+
+/// Where log lines go.
+class LogSink {
+public:
+    virtual ~LogSink() = default;
+    virtual void write(LogPriority priority, std::string_view text) = 0;
+};
+
+/// The process-wide system log. Without a sink, lines are dropped.
+class SystemLog {
+public:
+    static constexpr int kEverything = 7;
+
+    /// Lines whose level is above `threshold` (0 to 7) are dropped before their text is made.
+    /// `sink` may be null; it must outlive its use. Not for use from several threads at once.
+    static void setSink(LogSink* sink, int threshold = kEverything);
+
+    static bool isEnabled(LogPriority priority) {
+        constexpr int kLevelBits = 7;
+        return (static_cast<int>(priority) & kLevelBits) <= _threshold;
+    }
+    static void write(LogPriority priority, std::string_view text);
+
+private:
+    static LogSink* _sink;
+    static int _threshold; // -1 while there is no sink
+};
+
+/// Logs a line. `format` is printf's, with %@ for objects; see `formatText`.
+template <class... Arguments>
+void systemLog(LogPriority priority, std::string_view format, const Arguments&... arguments) {
+    if (SystemLog::isEnabled(priority)) {
+        SystemLog::write(priority, formatText(format, {FormatArgument(arguments)...}));
+    }
+}
+
+} // namespace pallax
