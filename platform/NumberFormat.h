@@ -102,6 +102,7 @@ public:
 
     constexpr bool isReal() const { return _conversion.conversion == 'f'; }
     constexpr std::string_view unit() const { return _unit; }
+    constexpr const NumberConversion& conversion() const { return _conversion; }
 
     void append(std::string& out, std::int64_t number) const;
     void append(std::string& out, double number) const;

@@ -1,0 +1,76 @@
+#include "cli/DecodeCommand.h"
+
+#include "cli/FatalRecord.h"
+#include "platform/Format.h"
+
+namespace pallax {
+
+namespace {
+
+std::unique_ptr<DisplayOutput> displayOutput(const DecodeOptions& options, Output& output) {
+    if (options.format == DecodeFormat::Csv) {
+        return std::make_unique<CsvOutput>(output);
+    }
+    return std::make_unique<JsonOutput>(output, options.every);
+}
+
+} // namespace
+
+ExitStatus DecodeCommand::run(Output& output) {
+    const auto displays = displayOutput(_options, output);
+    ExitStatus status = kExitSuccess;
+    for (const std::string& path : _options.recordings) {
+        const ExitStatus result = decodePath(path, *displays);
+        status = result == kExitSuccess ? status : result;
+        if (result == kExitFatalRecord) {
+            break;
+        }
+    }
+    output.flush();
+    return status;
+}
+
+ExitStatus DecodeCommand::decodePath(const std::string& path, DisplayOutput& output) {
+    const Recording::OpenResult recording = _open(path);
+    if (!recording) {
+        _report(recording.error().sentence);
+        return kExitFailure;
+    }
+    return decode(**recording, output);
+}
+
+ExitStatus DecodeCommand::decode(Recording& recording, DisplayOutput& output) {
+    const RecordedTechnology* technology =
+        _options.technology != nullptr ? _options.technology : recording.technology();
+    if (technology == nullptr) {
+        _report(recording.foreignLinkType().sentence);
+        return kExitFailure;
+    }
+    RecordingDecoder decoder(_environment, technology->identifier, _options.every, output);
+    if (!decoder.hasGenerator()) {
+        _report(formatText("%@: there is no log generator for the technology %@",
+                           {recording.name(), technology->identifier}));
+        return kExitFailure;
+    }
+    return decodePackets(recording, decoder);
+}
+
+ExitStatus DecodeCommand::decodePackets(Recording& recording, RecordingDecoder& decoder) {
+    while (const auto packet = recording.next()) {
+        if (const auto reason = decoder.add(*packet)) {
+            _report(recording.name() + ": " +
+                    fatalRecordSentence(decoder.packets(), packet->data, *reason));
+            if (_options.strict) {
+                return kExitFatalRecord;
+            }
+        }
+    }
+    decoder.finish();
+    if (recording.error()) {
+        _report(recording.error()->sentence);
+        return kExitFailure;
+    }
+    return kExitSuccess;
+}
+
+} // namespace pallax

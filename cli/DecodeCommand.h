@@ -1,0 +1,55 @@
+#pragma once
+
+#include "cli/ExitStatus.h"
+#include "cli/RecordingDecoder.h"
+#include "host/Recording.h"
+
+#include <functional>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace pallax {
+
+enum class DecodeFormat { Json, Csv };
+
+struct DecodeOptions {
+    std::vector<std::string> recordings;
+    /// What to take every recording for, whatever its link type says.
+    const RecordedTechnology* technology = nullptr;
+    Every every = Every::End;
+    DecodeFormat format = DecodeFormat::Json;
+    std::optional<std::string> systemLog; ///< path of a text file
+    bool strict = false;
+};
+
+/// `pallax decode`: recordings to JSON or CSV, in the order of the command line, each with a
+/// generator and a state of its own. A recording that cannot be read does not keep the others
+/// from being decoded.
+class DecodeCommand {
+public:
+    using Open = std::function<Recording::OpenResult(const std::string& path)>;
+    /// Gets one sentence for the user.
+    using Report = std::function<void(std::string_view sentence)>;
+
+    DecodeCommand(const DecodeOptions& options, const DecoderEnvironment& environment,
+                  Open open, Report report)
+        : _options(options), _environment(environment), _open(std::move(open)),
+          _report(std::move(report)) {}
+
+    /// Writes to `output`, whose exceptions leave.
+    ExitStatus run(Output& output);
+
+private:
+    ExitStatus decodePath(const std::string& path, DisplayOutput& output);
+    ExitStatus decode(Recording& recording, DisplayOutput& output);
+    ExitStatus decodePackets(Recording& recording, RecordingDecoder& decoder);
+
+    DecodeOptions _options;
+    DecoderEnvironment _environment;
+    Open _open;
+    Report _report;
+};
+
+} // namespace pallax

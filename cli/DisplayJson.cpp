@@ -1,0 +1,185 @@
+#include "cli/DisplayJson.h"
+
+#include "cli/Utf8.h"
+
+#include <algorithm>
+#include <array>
+#include <charconv>
+#include <cmath>
+#include <cstdint>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kHexDigits = "0123456789abcdef";
+constexpr unsigned char kFirstPrintable = 0x20;
+constexpr unsigned char kFirstBeyondAscii = 0x80;
+
+bool isPlain(char character) {
+    const auto byte = static_cast<unsigned char>(character);
+    return byte >= kFirstPrintable && byte < kFirstBeyondAscii && character != '"' &&
+           character != '\\';
+}
+
+void appendEscapedAscii(std::string& out, char character) {
+    constexpr std::string_view kNamed = "\"\\\b\f\n\r\t";
+    constexpr std::string_view kNames = "\"\\bfnrt";
+    const std::size_t named = kNamed.find(character);
+    if (named != std::string_view::npos) {
+        out += '\\';
+        out += kNames[named];
+        return;
+    }
+    const auto code = static_cast<unsigned char>(character);
+    out += "\\u00";
+    out += kHexDigits[code >> 4U];
+    out += kHexDigits[code & 0xFU];
+}
+
+void appendEscaped(std::string& out, std::string_view text) {
+    while (!text.empty()) {
+        std::size_t taken = 1;
+        if (isPlain(text.front())) {
+            out += text.front();
+        } else if (static_cast<unsigned char>(text.front()) < kFirstBeyondAscii) {
+            appendEscapedAscii(out, text.front());
+        } else if (const std::size_t length = utf8SequenceLength(text); length > 0) {
+            out += text.substr(0, length);
+            taken = length;
+        } else {
+            out += kReplacementCharacter;
+        }
+        text.remove_prefix(taken);
+    }
+}
+
+/// The value is appended first and looked at where it lies, for almost every text is plain.
+void appendStringValue(std::string& out, const PropertyList& object) {
+    out += '"';
+    const std::size_t start = out.size();
+    (void)object.appendString(out);
+    if (!std::all_of(out.begin() + static_cast<std::ptrdiff_t>(start), out.end(), isPlain)) {
+        const std::string text = out.substr(start);
+        out.resize(start);
+        appendEscaped(out, text);
+    }
+    out += '"';
+}
+
+template <class Number>
+void appendNumber(std::string& out, Number number) {
+    constexpr std::size_t kLongest = 32; // "-2.2250738585072014e-308" has 24 characters
+    std::array<char, kLongest> buffer{};
+    const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), number);
+    out.append(buffer.data(), result.ptr);
+}
+
+void appendReal(std::string& out, double number) {
+    if (std::isfinite(number)) {
+        appendNumber(out, number);
+    } else {
+        out += "null";
+    }
+}
+
+void appendBase64(std::string& out, Bytes bytes) {
+    constexpr std::string_view kDigits =
+        "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
+    constexpr std::size_t kGroup = 3;
+    out += '"';
+    for (std::size_t at = 0; at < bytes.size(); at += kGroup) {
+        const Bytes group = bytes.subspan(at, std::min(kGroup, bytes.size() - at));
+        std::uint32_t bits = 0;
+        for (std::size_t index = 0; index < kGroup; ++index) {
+            bits = (bits << 8U) | (index < group.size() ? group[index] : 0U);
+        }
+        for (std::size_t digit = 0; digit <= kGroup; ++digit) {
+            const std::uint32_t value = (bits >> (18U - 6U * digit)) & 0x3FU;
+            out += digit <= group.size() ? kDigits[value] : '=';
+        }
+    }
+    out += '"';
+}
+
+void appendValue(std::string& out, const PropertyList& object, int depth);
+
+void appendArray(std::string& out, const Array& elements, int depth) {
+    out += '[';
+    for (const PropertyList& element : elements) {
+        out += &element == elements.data() ? "" : ",";
+        appendValue(out, element, depth);
+    }
+    out += ']';
+}
+
+void appendDictionary(std::string& out, const Dictionary& entries, int depth) {
+    out += '{';
+    bool first = true;
+    for (const Dictionary::Entry& entry : entries) {
+        if (!entry.hasStringKey) {
+            continue;
+        }
+        out += first ? "" : ",";
+        first = false;
+        appendJsonString(out, entry.key.view());
+        out += ':';
+        appendValue(out, entry.value, depth);
+    }
+    out += '}';
+}
+
+void appendValue(std::string& out, const PropertyList& object, int depth) {
+    using Type = PropertyList::Type;
+    switch (object.type()) {
+    case Type::kNull:
+        out += "null";
+        return;
+    case Type::kString:
+        appendStringValue(out, object);
+        return;
+    case Type::kInteger:
+        appendNumber(out, *object.integer());
+        return;
+    case Type::kReal:
+        appendReal(out, *object.real());
+        return;
+    case Type::kBoolean:
+        out += *object.boolean() ? "true" : "false";
+        return;
+    case Type::kData:
+        appendBase64(out, *object.data());
+        return;
+    case Type::kDate:
+        appendJsonString(out, isoDateText(*object.date()).value_or(dateText(*object.date())));
+        return;
+    case Type::kArray:
+    case Type::kDictionary:
+        break;
+    }
+    if (depth >= kDeepestJson) {
+        out += "null";
+    } else if (const DictionaryRef dictionary = object.dictionary()) {
+        appendDictionary(out, *dictionary, depth + 1);
+    } else {
+        appendArray(out, *object.array(), depth + 1);
+    }
+}
+
+} // namespace
+
+void appendJson(std::string& out, const PropertyList& object) {
+    appendValue(out, object, 0);
+}
+
+void appendJsonString(std::string& out, std::string_view text) {
+    out += '"';
+    if (std::all_of(text.begin(), text.end(), isPlain)) {
+        out += text;
+    } else {
+        appendEscaped(out, text);
+    }
+    out += '"';
+}
+
+} // namespace pallax

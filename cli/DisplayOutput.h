@@ -1,0 +1,78 @@
+#pragma once
+
+#include "cli/Output.h"
+#include "platform/Date.h"
+#include "platform/PropertyList.h"
+
+#include <cstdint>
+#include <map>
+#include <string>
+#include <string_view>
+#include <utility>
+
+namespace pallax {
+
+class PallaxModelNode;
+
+/// How often a recording's display is shown.
+enum class Every { End, Tick, Packet };
+
+/// When a display was as it is shown.
+struct DisplayMoment {
+    std::uint64_t number = 0; ///< of the tick or packet, from 1
+    Time time;
+};
+
+/// Where the displays of recordings go, one recording after the other.
+class DisplayOutput {
+public:
+    virtual ~DisplayOutput() = default;
+    virtual void beginRecording() = 0;
+    /// `display` is null when there is none yet.
+    virtual void show(const DisplayMoment& moment, const PropertyList& display) = 0;
+};
+
+/// One JSON object a line: the display itself with Every::End, else
+/// {"tick":1,"time":"2023-11-14T22:13:20.000Z","display":{…}}, "packet" instead of "tick".
+class JsonOutput final : public DisplayOutput {
+public:
+    JsonOutput(Output& output, Every every) : _output(output), _every(every) {}
+
+    void beginRecording() override {}
+    void show(const DisplayMoment& moment, const PropertyList& display) override;
+
+private:
+    Output& _output;
+    Every _every;
+};
+
+/// A table "time,path,value,number,unit" (RFC 4180, lines end in "\n"; the header once): a row
+/// when the value at a path of the display tree is not what it was in the recording's previous
+/// display. The rows of one display come in display order; then, by path, those of the paths that
+/// are gone, whose value, number and unit are empty. `number` is the bare decimal number of a
+/// value that is one, empty for any other (and for one that is not finite).
+class CsvOutput final : public DisplayOutput {
+public:
+    explicit CsvOutput(Output& output);
+
+    void beginRecording() override { _shown.clear(); }
+    void show(const DisplayMoment& moment, const PropertyList& display) override;
+
+private:
+    struct Shown {
+        std::string cells; ///< "value,number,unit" as written
+        std::uint64_t display = 0;
+    };
+
+    void showNode(const PallaxModelNode& node, const std::string& path);
+    void showLeaf(const std::string& path, const PropertyList& value);
+    void writeRow(std::string_view path, std::string_view cells);
+
+    Output& _output;
+    /// By path and count of earlier nodes of the same path in the display.
+    std::map<std::pair<std::string, int>, Shown> _shown;
+    std::uint64_t _display = 0;
+    std::string _time;
+};
+
+} // namespace pallax

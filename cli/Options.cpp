@@ -1,0 +1,202 @@
+#include "cli/Options.h"
+
+#include <CLI/CLI.hpp>
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+#include <map>
+
+namespace pallax {
+
+namespace {
+
+constexpr const char* kVersionText = "pallax " PALLAX_VERSION;
+
+constexpr const char* kFooter = R"(Examples:
+  pallax                               browse the live modem
+  pallax drive.pcap --speed 4          browse a recording, four times as fast
+  modem-dump | pallax -                browse what another program records
+  pallax decode drive.pcap             its last display as JSON
+  pallax decode --every tick --format csv drive.pcap > drive.csv
+  pallax service --play drive.pcap     let viewers connect to a played recording
+
+A recording that is named like a command is given with its folder: pallax ./decode
+
+Exit status: 0 success, 1 failure, 2 wrong usage, 70 ended by a fatal record.)";
+
+constexpr const char* kDecodeFooter = R"(Examples:
+  pallax decode drive.pcap
+  pallax decode --every tick drive.pcap | jq .display
+  pallax decode --every packet --format csv --technology lte raw.pcap
+  pallax decode --system-log drive.log drive.pcap
+
+Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is standard input.)";
+
+constexpr const char* kServiceFooter = R"(Examples:
+  pallax service --play drive.pcap
+  pallax service --play drive.pcap --speed max --loop)";
+
+/// Positive and finite, or "max".
+bool readSpeed(const std::string& text, PlaySpeed& speed) {
+    if (text == "max") {
+        speed = std::nullopt;
+        return true;
+    }
+    double number = 0;
+    const char* const end = text.data() + text.size();
+    const auto result = std::from_chars(text.data(), end, number);
+    if (result.ec != std::errc() || result.ptr != end || !std::isfinite(number) || number <= 0) {
+        return false;
+    }
+    speed = number;
+    return true;
+}
+
+void addSpeed(CLI::App& app, PlaySpeed& speed) {
+    app.add_option_function<std::string>(
+           "--speed",
+           [&speed](const std::string& text) {
+               if (!readSpeed(text, speed)) {
+                   throw CLI::ValidationError("--speed", "\"" + text +
+                                                             "\" is neither a number above 0 "
+                                                             "nor max");
+               }
+           },
+           "Play that many times as fast; max: as fast as possible")
+        ->type_name("X|max");
+}
+
+/// Every choice goes by its name in the map, in the help and in the message about a wrong one.
+template <class Value>
+void addChoice(CLI::App& app, const std::string& name, Value& value,
+               const std::vector<std::pair<std::string, Value>>& choices,
+               const std::string& description) {
+    std::string names;
+    for (const auto& choice : choices) {
+        names += (names.empty() ? "" : "|") + choice.first;
+    }
+    const auto take = [name, &value, choices, names](const std::string& text) {
+        const auto found = std::find_if(choices.begin(), choices.end(), [&](const auto& choice) {
+            return choice.first == text;
+        });
+        if (found == choices.end()) {
+            throw CLI::ValidationError(name, "\"" + text + "\" is none of " + names);
+        }
+        value = found->second;
+    };
+    app.add_option_function<std::string>(name, take, description)->type_name(names);
+}
+
+void addBrowse(CLI::App& app, BrowseOptions& options) {
+    constexpr int kHighestLevel = 7;
+    app.add_option("RECORDING", options.recording,
+                   "A recording (pcap or pcapng; - is standard input) to browse as it is played; "
+                   "without one, the live modem")
+        ->type_name("");
+    app.add_flag("--print", options.print, "Print the tree as text at each display tick");
+    addSpeed(app, options.speed);
+    app.add_flag("--loop", options.loop, "Begin again at the recording's end");
+    app.add_flag("--keep-going", options.keepGoing,
+                 "Drop a record that cannot be read instead of ending with status 70");
+    app.add_option("--log-level", options.logLevel,
+                   "Write system-log lines up to this priority to standard error")
+        ->check(CLI::Range(0, kHighestLevel))
+        ->type_name("0-7");
+}
+
+void addDecode(CLI::App& app, DecodeOptions& options) {
+    std::vector<std::pair<std::string, const RecordedTechnology*>> technologies;
+    for (const RecordedTechnology& technology : recordedTechnologies()) {
+        technologies.emplace_back(technology.commandName, &technology);
+    }
+    addChoice(app, "--technology", options.technology, technologies,
+              "What the recordings are of (otherwise their link type tells)");
+    addChoice<Every>(app, "--every", options.every,
+                     {{"end", Every::End}, {"tick", Every::Tick}, {"packet", Every::Packet}},
+                     "When the display is written (default: end)");
+    addChoice<DecodeFormat>(app, "--format", options.format,
+                            {{"json", DecodeFormat::Json}, {"csv", DecodeFormat::Csv}},
+                            "JSON, one object a line, or CSV (default: json)");
+    app.add_option("--system-log", options.systemLog, "Write every system-log line to this file")
+        ->type_name("FILE");
+    app.add_flag("--strict", options.strict,
+                 "End with status 70 at a record that cannot be read instead of skipping it");
+    app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
+        ->required()
+        ->type_name("...");
+    app.footer(kDecodeFooter);
+}
+
+void addService(CLI::App& app, ServiceOptions& options) {
+    app.add_option("--play", options.recording, "The recording to play to each viewer")
+        ->required()
+        ->type_name("RECORDING");
+    addSpeed(app, options.speed);
+    app.add_flag("--loop", options.loop, "Begin again at the recording's end");
+    app.footer(kServiceFooter);
+}
+
+/// CLI11's messages may have several lines; the user gets one sentence.
+ParseEnd wrongUsage(std::string reason) {
+    std::replace(reason.begin(), reason.end(), '\n', ' ');
+    return {kExitWrongUsage, "pallax: " + reason + " (pallax --help tells more)\n"};
+}
+
+ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
+    if (dynamic_cast<const CLI::CallForVersion*>(&error) != nullptr) {
+        return {kExitSuccess, std::string(kVersionText) + "\n"};
+    }
+    if (error.get_exit_code() == static_cast<int>(CLI::ExitCodes::Success)) {
+        return {kExitSuccess, app.help()};
+    }
+    return wrongUsage(error.what());
+}
+
+/// The help and version flags that every command has.
+void prepare(CLI::App& app) {
+    app.set_help_flag("-h,--help", "Show this help and exit");
+    app.set_version_flag("--version", kVersionText, "Show the version and exit");
+}
+
+} // namespace
+
+ParsedOptions parseOptions(std::vector<std::string> arguments) {
+    CLI::App app("Pallax shows what a phone's cellular radio is doing.", "pallax");
+    BrowseOptions browse;
+    DecodeOptions decode;
+    ServiceOptions service;
+    prepare(app);
+    addBrowse(app, browse);
+    app.footer(kFooter);
+    CLI::App* decodeApp = app.add_subcommand("decode", "Recordings to JSON or CSV");
+    prepare(*decodeApp);
+    addDecode(*decodeApp, decode);
+    CLI::App* serviceApp =
+        app.add_subcommand("service", "Run the telephony service that viewers connect to");
+    prepare(*serviceApp);
+    addService(*serviceApp, service);
+
+    const std::string first = arguments.empty() ? "" : arguments.front();
+    std::reverse(arguments.begin(), arguments.end()); // as CLI11 takes them
+    try {
+        app.parse(arguments);
+    } catch (const CLI::ParseError& error) {
+        return parseEnd(app, error);
+    }
+    for (const CLI::App* command : app.get_subcommands()) {
+        if (command->get_name() != first) {
+            return wrongUsage("the command \"" + command->get_name() +
+                              "\" must come first, without options before it");
+        }
+    }
+    if (decodeApp->parsed()) {
+        return decode;
+    }
+    if (serviceApp->parsed()) {
+        return service;
+    }
+    return browse;
+}
+
+} // namespace pallax

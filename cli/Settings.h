@@ -1,0 +1,37 @@
+#pragma once
+
+#include "cli/FatalRecord.h"
+#include "platform/Result.h"
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace pallax {
+
+/// What the settings file says; without one, the defaults hold. Lines are `key = value`, empty,
+/// or a comment from "#" on its own line.
+struct Settings {
+    OnFatalRecord onFatalRecord = OnFatalRecord::Stop; ///< on-fatal-record = stop | skip
+    std::optional<std::string> snapshotDirectory;      ///< snapshot-directory = PATH
+    std::optional<std::string> saveButtonMarker;       ///< save-button-marker = PATH
+};
+
+/// One clear sentence that names file and line.
+struct SettingsError {
+    std::string sentence;
+};
+
+using SettingsResult = Result<Settings, SettingsError>;
+
+SettingsResult parseSettings(std::string_view text, std::string_view file);
+
+/// Reads the first of the files that exists; the defaults when there is none.
+SettingsResult loadSettings(const std::vector<std::string>& files);
+
+/// Where settings are looked for: in the user's configuration folder ($XDG_CONFIG_HOME, else
+/// ~/.config), then in the system's.
+std::vector<std::string> settingsFiles();
+
+} // namespace pallax

@@ -1,0 +1,84 @@
+#include "cli/TickGrid.h"
+
+#include <gtest/gtest.h>
+#include <rapidcheck.h>
+
+namespace pallax {
+namespace {
+
+using std::chrono::milliseconds;
+using std::chrono::seconds;
+
+const Time kFirst{seconds(1700000000)};
+
+struct Passed {
+    std::uint64_t number;
+    Time time;
+    friend bool operator==(const Passed&, const Passed&) = default;
+};
+
+std::optional<Passed> passedBefore(TickGrid& grid, Time packet) {
+    const auto tick = grid.passedBefore(packet);
+    return tick ? std::optional<Passed>({tick->number, tick->time}) : std::nullopt;
+}
+
+TEST(TickGrid, ThePacketAtATicksTimeComesAfterTheTick) {
+    TickGrid grid;
+    EXPECT_EQ(passedBefore(grid, kFirst), std::nullopt);
+    EXPECT_EQ(passedBefore(grid, kFirst + milliseconds(1999)), std::nullopt);
+    EXPECT_EQ(passedBefore(grid, kFirst + seconds(2)), (Passed{1, kFirst + seconds(2)}));
+    EXPECT_EQ(passedBefore(grid, kFirst + seconds(2)), std::nullopt);
+    EXPECT_EQ(grid.next().number, 2U);
+    EXPECT_EQ(grid.next().time, kFirst + seconds(4));
+}
+
+TEST(TickGrid, OfSeveralTicksInAGapTheFirstIsTold) {
+    TickGrid grid;
+    (void)grid.passedBefore(kFirst);
+    EXPECT_EQ(passedBefore(grid, kFirst + seconds(11)), (Passed{1, kFirst + seconds(2)}));
+    EXPECT_EQ(passedBefore(grid, kFirst + seconds(12)), (Passed{6, kFirst + seconds(12)}));
+}
+
+TEST(TickGrid, TimeThatGoesBackwardsMakesNoTick) {
+    TickGrid grid;
+    (void)grid.passedBefore(kFirst);
+    (void)grid.passedBefore(kFirst + seconds(5));
+    EXPECT_EQ(passedBefore(grid, kFirst - seconds(100)), std::nullopt);
+    EXPECT_EQ(passedBefore(grid, kFirst + seconds(3)), std::nullopt);
+    EXPECT_EQ(passedBefore(grid, kFirst + seconds(6)), (Passed{3, kFirst + seconds(6)}));
+}
+
+TEST(TickGrid, TheWholeRangeOfTimeIsOneStep) {
+    TickGrid grid;
+    (void)grid.passedBefore(Time::min());
+    EXPECT_EQ(grid.passedBefore(Time::max())->number, 1U);
+    EXPECT_EQ(grid.next().time, Time::max());
+    TickGrid late;
+    (void)late.passedBefore(Time::max());
+    EXPECT_EQ(late.next().number, 1U);
+    EXPECT_EQ(late.next().time, Time::max());
+}
+
+TEST(TickGrid, GivesWhatSteppingGives) {
+    EXPECT_TRUE(rc::check([](const std::vector<std::int16_t>& steps) {
+        TickGrid grid;
+        Time packet = kFirst;
+        std::uint64_t passed = 0;
+        for (const std::int16_t step : steps) {
+            packet += milliseconds(step);
+            if (&step == steps.data()) {
+                packet = kFirst;
+            }
+            const std::uint64_t before = passed;
+            while (packet >= kFirst + seconds(2) * static_cast<std::int64_t>(passed + 1)) {
+                ++passed;
+            }
+            const auto tick = grid.passedBefore(packet);
+            RC_ASSERT(tick.has_value() == (passed > before));
+            RC_ASSERT(!tick || tick->number == before + 1);
+        }
+    }));
+}
+
+} // namespace
+} // namespace pallax
