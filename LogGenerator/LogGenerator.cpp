@@ -1,15 +1,12 @@
 #include "LogGenerator/LogGenerator.h"
 
+#include "LogGenerator/Records/Exceptions.h"
 #include "platform/Clock.h"
 #include "platform/SystemLog.h"
 
 namespace pallax {
 
 namespace {
-
-[[noreturn]] void refuse(const char* operation) {
-    throw UnrecognisedOperation(std::string("unrecognised operation: ") + operation);
-}
 
 /// The entry of the state as it is now; it ends at the first value that is missing.
 Dictionary historyEntry(const Dictionary& state, const Clock& clock) {
@@ -34,19 +31,19 @@ LogGenerator::LogGenerator(const GeneratorEnvironment& environment) : _environme
 }
 
 void LogGenerator::updateState(Dictionary& /*state*/, Bytes /*data*/) {
-    refuse("updateState:withData:");
+    throw UnrecognisedOperation("updateState:withData:");
 }
 
 PropertyList LogGenerator::generateLogUsingState(Dictionary& /*state*/) {
-    refuse("generateLogUsingState:");
+    throw UnrecognisedOperation("generateLogUsingState:");
 }
 
 PropertyList LogGenerator::getStartCommand() const {
-    refuse("getStartCommand");
+    throw UnrecognisedOperation("getStartCommand");
 }
 
 PropertyList LogGenerator::getSaveContentsFromState(const Dictionary& /*state*/) const {
-    refuse("getSaveContentsFromState:");
+    throw UnrecognisedOperation("getSaveContentsFromState:");
 }
 
 void LogGenerator::updateHistoryInState(Dictionary& state, const Clock& clock) {

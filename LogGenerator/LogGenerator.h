@@ -5,7 +5,6 @@
 
 #include <memory>
 #include <span>
-#include <stdexcept>
 #include <string_view>
 
 namespace pallax {
@@ -14,18 +13,14 @@ class Bundle;
 class Clock;
 class LogGenerator;
 class Resources;
+class StandardOutput;
 
 /// What a generator needs of its surroundings. All of it outlives the generator.
 struct GeneratorEnvironment {
-    const Clock& clock;         ///< history dates, the DLF's time stamp
-    const Resources& resources; ///< display templates
-    const Bundle& bundle;       ///< the DLF's application text and build date
-};
-
-/// Thrown by an abstract operation that a subclass has not overridden: a programming error.
-class UnrecognisedOperation : public std::logic_error {
-public:
-    using std::logic_error::logic_error;
+    const Clock& clock;             ///< history dates, the DLF's time stamp
+    const Resources& resources;     ///< display templates
+    const Bundle& bundle;           ///< the DLF's application text and build date
+    StandardOutput& standardOutput; ///< destruction notices
 };
 
 /// One row of the technology table: what the modem answers, and who speaks it.
@@ -48,6 +43,8 @@ public:
     virtual ~LogGenerator() = default;
     LogGenerator(const LogGenerator&) = delete;
     LogGenerator& operator=(const LogGenerator&) = delete;
+
+    /// Abstract operations throw UnrecognisedOperation unless overridden.
 
     /// One message from the log channel; an empty one counts as null. A record that throws lets
     /// its exception leave, and the packet is then not captured.

@@ -1,0 +1,26 @@
+#pragma once
+
+#include "LogGenerator/Records/LogCode.h"
+#include "LogGenerator/Records/LogRecord.h"
+#include "platform/Bytes.h"
+
+namespace pallax {
+
+/// The first byte of a message that begins with the 2-byte transport prefix.
+inline constexpr std::uint8_t kTransportPrefix = 0x81;
+inline constexpr std::size_t kTransportPrefixLength = 2;
+
+/// The log record of a message: the message without its transport prefix, if it has one. Null
+/// (empty) for a null message and for one that holds nothing but the prefix. The record is a view
+/// into `data`.
+///
+///   byte  width  field
+///   0     8      0x81
+///   1     8      not interpreted
+///   2            the log record
+Bytes LogPacketStripPrefix(Bytes data);
+
+/// The effective log code of a record of at least 5 bytes; checks neither length nor log type.
+LogCode LogPacketGetLogCode(const LogRecord& record);
+
+} // namespace pallax

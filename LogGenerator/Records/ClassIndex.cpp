@@ -1,0 +1,36 @@
+#include "LogGenerator/Records/ClassIndex.h"
+
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+ClassIndex::~ClassIndex() {
+    _output.printLine("Deallocing ClassIndex");
+}
+
+Base* ClassIndex::getClass(std::string_view sectionName) const {
+    const auto found = classDict.find(sectionName);
+    return found != classDict.end() ? found->second : nullptr;
+}
+
+const std::vector<Base*>* ClassIndex::getSubscribers(LogCode logCode) const {
+    const auto found = codeDictionary.find(logCode);
+    return found != codeDictionary.end() ? &found->second : nullptr;
+}
+
+std::vector<std::string> ClassIndex::getAllLogCodes() const {
+    std::vector<std::string> codes;
+    codes.reserve(codeDictionary.size());
+    for (const auto& entry : codeDictionary) {
+        codes.push_back(std::to_string(entry.first));
+    }
+    return codes;
+}
+
+void ClassIndex::status() const {
+    // The section dictionary is one by its type here; the two lines stay for those who read logs.
+    systemLog(LogPriority::Warning, "Dictionary = %d", 1);
+    systemLog(LogPriority::Warning, "String = %d", 0);
+}
+
+} // namespace pallax

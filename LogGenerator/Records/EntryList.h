@@ -1,0 +1,69 @@
+#pragma once
+
+#include "LogGenerator/Records/Exceptions.h"
+#include "LogGenerator/Records/LogRecord.h"
+#include "platform/PropertyList.h"
+
+#include <algorithm>
+#include <cstddef>
+
+namespace pallax {
+
+/// The repeated entries of a record, as many as the record says, of which only whole ones are
+/// ever walked: an entry is whole when every byte that is read for it lies inside the record.
+class EntryList {
+public:
+    struct Layout {
+        std::size_t start;     ///< of entry 0, from byte 0 of the record
+        std::size_t stride;    ///< from one entry's start to the next
+        std::size_t bytesRead; ///< from an entry's start to behind the last byte read of it
+    };
+
+    EntryList(const LogRecord& record, const Layout& layout, std::size_t count)
+        : _record(record), _layout(layout), _count(count) {}
+
+    std::size_t count() const { return _count; }
+
+    /// The entry, whole or not. Throws ArrayOutOfBoundsException when `index` is not below the
+    /// count that the record carries.
+    LogRecord at(std::size_t index) const {
+        if (index >= _count) {
+            throw ArrayOutOfBoundsException();
+        }
+        return _record.from(_layout.start + index * _layout.stride);
+    }
+
+    bool isWhole(std::size_t index) const {
+        return _record.has(_layout.start + index * _layout.stride + _layout.bytesRead);
+    }
+
+    /// How many entries stand before the first one that is not whole. For layouts with a stride
+    /// of at least 1, so that what a record claims costs no more than what it holds.
+    std::size_t wholeCount() const {
+        const std::size_t first = _layout.start + _layout.bytesRead;
+        if (!_record.has(first)) {
+            return 0;
+        }
+        return std::min(_count, (_record.length() - first) / _layout.stride + 1);
+    }
+
+    /// A list of what `make` (LogRecord entry, std::size_t index -> PropertyList) gives for each
+    /// entry up to the first that is not whole.
+    template <class Make>
+    Array map(const Make& make) const {
+        const std::size_t whole = wholeCount();
+        Array list;
+        list.reserve(whole);
+        for (std::size_t index = 0; index < whole; ++index) {
+            list.emplace_back(make(at(index), index));
+        }
+        return list;
+    }
+
+private:
+    LogRecord _record;
+    Layout _layout;
+    std::size_t _count;
+};
+
+} // namespace pallax

@@ -1,0 +1,37 @@
+#pragma once
+
+#include <exception>
+#include <stdexcept>
+#include <string>
+
+namespace pallax {
+
+/// Thrown by an abstract operation that a subclass has not overridden: a programming error.
+class UnrecognisedOperation : public std::logic_error {
+public:
+    explicit UnrecognisedOperation(const std::string& operation)
+        : std::logic_error("unrecognised operation: " + operation) {}
+};
+
+/// Thrown by an element accessor of a record layout when the index is not below the element
+/// count that the record itself carries. Nothing in the core catches it.
+class ArrayOutOfBoundsException : public std::exception {
+public:
+    const char* what() const noexcept override {
+        return "an element index at or past the record's own element count";
+    }
+};
+
+/// The reader of the SIM-file record.
+class LogCode_0xFF000020 { // NOLINT(readability-identifier-naming): the record's own name
+public:
+    /// Thrown when the property list embedded in the record cannot be parsed.
+    class UnknownDataException : public std::exception {
+    public:
+        const char* what() const noexcept override {
+            return "the embedded property list cannot be parsed";
+        }
+    };
+};
+
+} // namespace pallax

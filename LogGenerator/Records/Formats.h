@@ -1,0 +1,13 @@
+#pragma once
+
+#include "platform/NumberFormat.h"
+
+/// The formats that several records share.
+namespace pallax {
+
+inline constexpr NumberFormat kDecimal{"%d"};
+inline constexpr NumberFormat kUnsignedDecimal{"%u"};
+inline constexpr NumberFormat kDecimalDbm{"%d dBm"};
+inline constexpr NumberFormat kDecimalDb{"%d dB"};
+
+} // namespace pallax

@@ -1,0 +1,89 @@
+#pragma once
+
+#include "platform/Bytes.h"
+
+#include <cstddef>
+#include <cstdint>
+
+namespace pallax {
+
+/// Where a number stands in a record: from bit `bit` of byte `byte` on (bit 0 is the least
+/// significant), `width` bits (1 to 32), the low bits in the lower bytes.
+struct Position {
+    std::size_t byte = 0;
+    unsigned bit = 0;
+    unsigned width = 8;
+    bool isSigned = false;
+    /// High byte first; whole bytes only.
+    bool bigEndian = false;
+};
+
+constexpr Position u8At(std::size_t byte) {
+    return {byte, 0, 8};
+}
+constexpr Position s8At(std::size_t byte) {
+    return {byte, 0, 8, true};
+}
+constexpr Position u16At(std::size_t byte) {
+    return {byte, 0, 16};
+}
+constexpr Position s16At(std::size_t byte) {
+    return {byte, 0, 16, true};
+}
+constexpr Position u32At(std::size_t byte) {
+    return {byte, 0, 32};
+}
+constexpr Position s32At(std::size_t byte) {
+    return {byte, 0, 32, true};
+}
+constexpr Position bigEndianU16At(std::size_t byte) {
+    return {byte, 0, 16, false, true};
+}
+constexpr Position bitsAt(std::size_t byte, unsigned bit, unsigned width) {
+    return {byte, bit, width};
+}
+
+/// The bounds-checked view of one log record, or of an entry inside one. Offsets count from its
+/// first byte; bytes past the end read as zero. It does not own the bytes.
+///
+///   byte  width  field
+///   0     8      log type: 1, or 0xFF for an extended record
+///   3     16     log code, little-endian
+///   13           payload
+class LogRecord {
+public:
+    static constexpr std::size_t kHeaderLength = 13;
+    static constexpr std::uint8_t kStandardType = 1;
+    static constexpr std::uint8_t kExtendedType = 0xFF;
+
+    LogRecord() = default;
+    explicit LogRecord(Bytes bytes) : _bytes(bytes) {}
+
+    std::size_t length() const { return _bytes.size(); }
+    Bytes bytes() const { return _bytes; }
+    /// True when every byte below `end` lies inside.
+    bool has(std::size_t end) const { return end <= _bytes.size(); }
+    /// What follows the header; empty when nothing does.
+    Bytes payload() const { return from(kHeaderLength).bytes(); }
+    /// The view from `start` on; empty when that is past the end.
+    LogRecord from(std::size_t start) const {
+        return LogRecord(start < _bytes.size() ? _bytes.subspan(start) : Bytes());
+    }
+
+    std::uint8_t u8(std::size_t at) const { return at < _bytes.size() ? _bytes[at] : 0; }
+    std::uint16_t u16(std::size_t at) const {
+        return static_cast<std::uint16_t>(u8(at) | (u8(at + 1) << 8U));
+    }
+    std::uint32_t u32(std::size_t at) const {
+        return u16(at) | (static_cast<std::uint32_t>(u16(at + 2)) << 16U);
+    }
+    std::int16_t s16(std::size_t at) const { return static_cast<std::int16_t>(u16(at)); }
+
+    /// The number at `position`, sign-extended where that is signed.
+    std::int64_t read(const Position& position) const;
+
+private:
+    Bytes _bytes;
+};
+
+} // namespace pallax

@@ -1,0 +1,17 @@
+#include "LogGenerator/Technologies/Technologies.h"
+
+#include "LogGenerator/ZOR_GSM/ZOR_GSMLogGenerator.h"
+#include "platform/TelephonyConstants.h"
+
+#include <array>
+
+namespace pallax {
+
+std::span<const Technology> technologies() {
+    static constexpr auto kTechnologies = std::to_array<Technology>({
+        {kHXLogChannelTechnology_Zorell_GSM, ZOR_GSMLogGenerator::generator},
+    });
+    return kTechnologies;
+}
+
+} // namespace pallax

@@ -1,0 +1,96 @@
+#include "LogGenerator/ZORLogGenerator.h"
+
+#include "LogGenerator/DlfVersionReport.h"
+#include "platform/Bundle.h"
+#include "platform/Clock.h"
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+namespace {
+
+DlfTime dlfTimeOf(const Clock& clock) {
+    constexpr int kSecondsPerMinute = 60;
+    const Time now = clock.now();
+    const Clock::Zone zone = clock.zone(now);
+    return {static_cast<std::uint32_t>(dateOf(now).time_since_epoch().count()),
+            static_cast<std::int16_t>(zone.offset.count() / kSecondsPerMinute),
+            static_cast<std::uint8_t>(zone.daylightSaving ? 1 : 0)};
+}
+
+/// The entries of the state's history; none without one.
+Array historyOf(const Dictionary& state) {
+    const PropertyList* found = state.find("History");
+    const ArrayRef history = found != nullptr ? found->array() : nullptr;
+    return history != nullptr ? *history : Array();
+}
+
+} // namespace
+
+std::optional<ByteBuffer> dlfHeader(std::size_t size, const GeneratorEnvironment& environment) {
+    constexpr std::uint16_t kVersionNumber = 1;
+    const auto version = environment.bundle.version();
+    const std::string application = version ? formatText("Pallax %@", {*version}) : "(none)";
+    ByteBuffer buffer(size);
+    std::uint32_t written = 0;
+    const DlfResult result = ETLDLFAddVersionReport(
+        buffer, written, kVersionNumber, kVersionNumber, application, "EXECUTABLE_NAME",
+        environment.bundle.buildDate(), dlfTimeOf(environment.clock));
+    if (result != DlfResult::Success) {
+        systemLog(LogPriority::DlfFailure, "Could not write DLF header (result=%d)",
+                  static_cast<int>(result));
+        return std::nullopt;
+    }
+    return buffer;
+}
+
+ZORLogGenerator::ZORLogGenerator(const GeneratorEnvironment& environment)
+    : LogGenerator(environment), _binData(std::make_shared<ByteBuffer>()) {}
+
+void ZORLogGenerator::capture(Bytes packet) {
+    _binData->insert(_binData->end(), packet.begin(), packet.end());
+}
+
+void ZORLogGenerator::handOverCapture(Dictionary& state) {
+    state.setFixed("DisplayState", SharedBytes(std::move(_binData)));
+    _binData = std::make_shared<ByteBuffer>();
+}
+
+std::optional<ByteBuffer> ZORLogGenerator::generateDlfFromState(const Dictionary& state) const {
+    // Only the first byte of a whole capture is dropped, not that of every packet in it.
+    constexpr std::size_t kSkipped = 1;
+    auto log = dlfHeader(kDlfVersionReportSize, environment());
+    if (!log) {
+        return std::nullopt;
+    }
+    for (const PropertyList& entry : historyOf(state)) {
+        const DictionaryRef fields = entry.dictionary();
+        const PropertyList* captured = fields != nullptr ? fields->find("DisplayState") : nullptr;
+        if (captured == nullptr) {
+            continue;
+        }
+        const SharedBytes data = captured->data();
+        if (data == nullptr) {
+            systemLog(LogPriority::DlfFailure,
+                      "Got wrong class writing history to DLF; aborting writing the DLF file");
+            return std::nullopt;
+        }
+        if (data->size() > kSkipped) {
+            log->insert(log->end(), data->begin() + kSkipped, data->end());
+        }
+    }
+    return log;
+}
+
+PropertyList ZORLogGenerator::getSaveContentsFromState(const Dictionary& state) const {
+    Array contents = historyOf(state);
+    if (auto log = generateDlfFromState(state)) {
+        Dictionary entry;
+        entry.setFixed("Description", formatText("DLF binary (%d bytes)", {log->size()}));
+        entry.setFixed("DLF", PropertyList::data(std::move(*log)));
+        contents.emplace_back(std::move(entry));
+    }
+    return contents;
+}
+
+} // namespace pallax

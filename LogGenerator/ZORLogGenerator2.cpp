@@ -1,0 +1,173 @@
+#include "LogGenerator/ZORLogGenerator2.h"
+
+#include "LogGenerator/LogPacket.h"
+#include "platform/Resources.h"
+#include "platform/SystemLog.h"
+
+#include <charconv>
+
+namespace pallax {
+
+namespace {
+
+/// Logs the creation before the base is built, where the line belongs.
+const GeneratorEnvironment& announced(const GeneratorEnvironment& environment,
+                                      const ClassIndex* index) {
+    systemLog(LogPriority::Error, "Creating ZORLogGenerator2 object with %p",
+              static_cast<const void*>(index));
+    return environment;
+}
+
+std::int32_t codeOf(const std::string& decimal) {
+    std::int32_t code = 0;
+    (void)std::from_chars(decimal.data(), decimal.data() + decimal.size(), code);
+    return code;
+}
+
+} // namespace
+
+ZORLogGenerator2::ZORLogGenerator2(const GeneratorEnvironment& environment, Parts parts)
+    : ZORLogGenerator(announced(environment, parts.cIndex.get())),
+      pListName(std::move(parts.pListName)), cIndex(std::move(parts.cIndex)) {
+    systemLog(LogPriority::Error, "Class Index: %ld", cIndex.use_count());
+}
+
+ZORLogGenerator2::~ZORLogGenerator2() {
+    // The text names one technology whatever the actual one is.
+    systemLog(LogPriority::Warning, "ZOR_GSMLogGenerator is destructed %p",
+              static_cast<const void*>(this));
+}
+
+void ZORLogGenerator2::updateState(Dictionary& state, Bytes data) {
+    (void)getDisplayFromState(state); // every record has its section before the first dispatch
+    updateWithData(data);
+    capture(data);
+}
+
+void ZORLogGenerator2::updateWithData(Bytes data) {
+    const LogRecord record(LogPacketStripPrefix(data));
+    if (!record.has(LogRecord::kHeaderLength)) {
+        systemLog(LogPriority::Warning, "Invalid data packet len=%lu expected=%lu", record.length(),
+                  LogRecord::kHeaderLength);
+        return;
+    }
+    const std::uint8_t type = record.u8(0);
+    if (type != LogRecord::kStandardType && type != LogRecord::kExtendedType) {
+        systemLog(LogPriority::Error, "Invalid log type: %x. Dropping.", type);
+        return;
+    }
+    const LogCode code = LogPacketGetLogCode(record);
+    const auto* subscribers = cIndex->getSubscribers(code);
+    if (subscribers == nullptr) {
+        return;
+    }
+    for (Base* subscriber : *subscribers) {
+        subscriber->updateWithData(record, code);
+    }
+}
+
+PropertyList ZORLogGenerator2::loadTemplate(Dictionary& state) const {
+    if (const PropertyList* kept = state.find("Template")) {
+        return *kept;
+    }
+    const auto loaded = environment().resources.propertyList(pListName);
+    if (!loaded || loaded->dictionary() == nullptr) {
+        systemLog(LogPriority::Error, "Cannot load template for display");
+        return {};
+    }
+    state.setFixed("Template", *loaded);
+    return *loaded;
+}
+
+PropertyList ZORLogGenerator2::getDisplayFromState(Dictionary& state) {
+    if (const PropertyList* display = state.find("Display")) {
+        return *display;
+    }
+    const PropertyList templateObject = loadTemplate(state);
+    if (templateObject.isNull()) {
+        return {};
+    }
+    systemLog(LogPriority::Warning, "Initialized class index: %p, Self: %p",
+              static_cast<const void*>(cIndex.get()), static_cast<const void*>(this));
+    cIndex->status();
+    const PropertyList display = processTemplate(templateObject);
+    printDict(display);
+    state.setFixed("Display", display);
+    state.setFixed("ExtraInfo", Dictionary());
+    return {};
+}
+
+PropertyList ZORLogGenerator2::processTemplate(const PropertyList& object) {
+    if (object.isString()) {
+        return object;
+    }
+    if (const DictionaryRef entries = object.dictionary()) {
+        const auto display = std::make_shared<Dictionary>();
+        for (const Dictionary::Entry& entry : *entries) {
+            if (!entry.hasStringKey) {
+                systemLog(LogPriority::Error, "Dictionary Key is not a string?");
+                continue;
+            }
+            PropertyList value = processTemplate(entry.value);
+            if (Base* record = cIndex->getClass(entry.key.view())) {
+                record->updateSectionRef(value);
+            }
+            if (!value.isNull()) { // a dictionary holds no nothing
+                display->set(entry.key, std::move(value));
+            }
+        }
+        return display;
+    }
+    if (const ArrayRef elements = object.array()) {
+        const auto list = std::make_shared<Array>();
+        for (const PropertyList& element : *elements) {
+            if (PropertyList value = processTemplate(element); !value.isNull()) {
+                list->push_back(std::move(value));
+            }
+        }
+        return list;
+    }
+    systemLog(LogPriority::Error, "Received an object of unknown type");
+    systemLog(LogPriority::Warning, "Processing the template");
+    return {};
+}
+
+void ZORLogGenerator2::printDict(const PropertyList& object) {
+    if (const DictionaryRef entries = object.dictionary()) {
+        for (const Dictionary::Entry& entry : *entries) {
+            printDict(entry.value);
+        }
+    } else if (const ArrayRef elements = object.array()) {
+        for (const PropertyList& element : *elements) {
+            printDict(element);
+        }
+    } else if (!object.isString()) {
+        systemLog(LogPriority::Error, "Received an object of unknown type");
+    }
+}
+
+PropertyList ZORLogGenerator2::generateLogUsingState(Dictionary& state) {
+    PropertyList display = getDisplayFromState(state);
+    handOverCapture(state);
+    updateHistoryInState(state, environment().clock);
+    return display;
+}
+
+PropertyList ZORLogGenerator2::getStartCommand() const {
+    constexpr auto kFirstExtraCode = static_cast<std::int32_t>(kExtendedLogCodes);
+    Array logCodes;
+    Array extraCodes;
+    for (const std::string& decimal : cIndex->getAllLogCodes()) {
+        const std::int32_t code = codeOf(decimal);
+        if (code >= kFirstExtraCode) {
+            extraCodes.push_back(PropertyList::integer(code - kFirstExtraCode));
+        } else {
+            logCodes.push_back(PropertyList::integer(code));
+        }
+    }
+    return Dictionary{{"SetState", "Streaming"},
+                      {"SetZorellLogCodes", std::move(logCodes)},
+                      {"SetHxExtraCodes", std::move(extraCodes)}};
+}
+
+} // namespace pallax

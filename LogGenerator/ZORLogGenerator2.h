@@ -1,0 +1,50 @@
+#pragma once
+
+#include "LogGenerator/Records/ClassIndex.h"
+#include "LogGenerator/ZORLogGenerator.h"
+
+#include <memory>
+#include <string>
+
+namespace pallax {
+
+/// The template-driven generator: builds the display from a template resource, hands each
+/// section to the record that owns it, dispatches every log record to the records subscribed to
+/// its code, and asks the modem for exactly those codes.
+///
+/// A template is a property list of dictionaries, arrays and strings; a dictionary key that
+/// equals a record's section name makes its value that record's section, at any depth.
+class ZORLogGenerator2 : public ZORLogGenerator {
+public:
+    ~ZORLogGenerator2() override;
+
+    void updateState(Dictionary& state, Bytes data) override;
+    PropertyList generateLogUsingState(Dictionary& state) override;
+    PropertyList getStartCommand() const override;
+
+    /// Framing and dispatch of one packet.
+    void updateWithData(Bytes data);
+    /// The live display made from a template object; null for anything but dictionary, array and
+    /// string. Records get their sections on the way.
+    PropertyList processTemplate(const PropertyList& object);
+    /// Logs what a display must not hold; changes nothing.
+    static void printDict(const PropertyList& object);
+    /// The display. The call that builds it returns null, and only later calls return it.
+    PropertyList getDisplayFromState(Dictionary& state);
+
+protected:
+    /// What a technology supplies: the template's resource name and a new class index.
+    struct Parts {
+        std::string pListName;
+        std::shared_ptr<ClassIndex> cIndex;
+    };
+    ZORLogGenerator2(const GeneratorEnvironment& environment, Parts parts);
+
+private:
+    PropertyList loadTemplate(Dictionary& state) const;
+
+    std::string pListName;
+    std::shared_ptr<ClassIndex> cIndex;
+};
+
+} // namespace pallax

@@ -1,0 +1,11 @@
+#include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
+
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+void NonRankedGSMSet::updateWithData(const LogRecord& /*record*/, LogCode /*logCode*/) {
+    systemLog(LogPriority::Warning, "NonRankedGSMSet");
+}
+
+} // namespace pallax

@@ -1,0 +1,11 @@
+#include "LogGenerator/ZOR_GSM/NonRankedUMTSSet.h"
+
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+void NonRankedUMTSSet::updateWithData(const LogRecord& /*record*/, LogCode /*logCode*/) {
+    systemLog(LogPriority::Warning, "NonRankedUMTSSet");
+}
+
+} // namespace pallax

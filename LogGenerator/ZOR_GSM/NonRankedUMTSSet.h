@@ -1,0 +1,17 @@
+#pragma once
+
+#include "LogGenerator/Records/Base.h"
+
+namespace pallax {
+
+/// The UMTS cells that are not ranked, section "Non-Ranked UMTS Set". No log code is known to carry
+/// them: the section shows, and stays empty.
+class NonRankedUMTSSet final : public Base {
+public:
+    std::string_view getSectionName() const override { return "Non-Ranked UMTS Set"; }
+    std::span<const LogCode> getLogCodeArray() const override { return {}; }
+    SectionKind sectionKind() const override { return SectionKind::List; }
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
+};
+
+} // namespace pallax
