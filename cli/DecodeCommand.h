@@ -33,8 +33,8 @@ public:
     /// Gets one sentence for the user.
     using Report = std::function<void(std::string_view sentence)>;
 
-    DecodeCommand(const DecodeOptions& options, const DecoderEnvironment& environment,
-                  Open open, Report report)
+    DecodeCommand(const DecodeOptions& options, const DecoderEnvironment& environment, Open open,
+                  Report report)
         : _options(options), _environment(environment), _open(std::move(open)),
           _report(std::move(report)) {}
 

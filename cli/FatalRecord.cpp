@@ -37,8 +37,8 @@ std::string fatalRecordSentence(std::uint64_t packet, Bytes message, std::string
 
 MessagePorts::Local GuardedMessagePorts::createLocal(std::string_view name,
                                                      ReceiveCallback receive) {
-    auto guarded = [this, receive = std::move(receive)](
-                       std::int32_t identifier, Bytes data) -> std::optional<ByteBuffer> {
+    auto guarded = [this, receive = std::move(receive)](std::int32_t identifier,
+                                                        Bytes data) -> std::optional<ByteBuffer> {
         // The callback may destroy the port, and with it this closure: nothing of it is touched
         // once the callback has been called.
         GuardedMessagePorts* const self = this;

@@ -77,9 +77,8 @@ void addChoice(CLI::App& app, const std::string& name, Value& value,
         names += (names.empty() ? "" : "|") + choice.first;
     }
     const auto take = [name, &value, choices, names](const std::string& text) {
-        const auto found = std::find_if(choices.begin(), choices.end(), [&](const auto& choice) {
-            return choice.first == text;
-        });
+        const auto found = std::find_if(choices.begin(), choices.end(),
+                                        [&](const auto& choice) { return choice.first == text; });
         if (found == choices.end()) {
             throw CLI::ValidationError(name, "\"" + text + "\" is none of " + names);
         }

@@ -9,7 +9,7 @@ RecordingDecoder::RecordingDecoder(const DecoderEnvironment& environment,
     : _every(every), _output(output),
       _generator(LogGenerator::generatorFromTechnology(
           Text(technology), environment.technologies,
-          {_clock, environment.resources, environment.bundle})) {
+          {_clock, environment.resources, environment.bundle, environment.standardOutput})) {
     _output.beginRecording();
 }
 

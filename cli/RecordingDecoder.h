@@ -20,6 +20,7 @@ namespace pallax {
 struct DecoderEnvironment {
     const Resources& resources;
     const Bundle& bundle;
+    StandardOutput& standardOutput; ///< the generators' notices, which are no part of a display
     std::span<const Technology> technologies;
 };
 

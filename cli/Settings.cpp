@@ -2,6 +2,7 @@
 
 #include "platform/Format.h"
 
+#include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
@@ -74,10 +75,10 @@ SettingsResult loadSettings(const std::vector<std::string>& files) {
             continue;
         }
         std::ifstream stream(file, std::ios::binary);
-        const std::string text{std::istreambuf_iterator<char>(stream), {}};
-        if (stream.bad() || !stream.is_open() || std::filesystem::is_directory(file, ignored)) {
+        if (!stream.is_open() || !std::filesystem::is_regular_file(file, ignored)) {
             return SettingsError{file + " cannot be read"};
         }
+        const std::string text{std::istreambuf_iterator<char>(stream), {}};
         return parseSettings(text, file);
     }
     return Settings{};

@@ -36,7 +36,7 @@ std::optional<TickGrid::Tick> TickGrid::passedBefore(Time packet) {
 TickGrid::Tick TickGrid::next() const {
     const std::uint64_t number = _passed + 1;
     const Time first = _first.value_or(Time());
-    const bool beyond = number * kIntervalCount > nanosecondsBetween(first, Time::max());
+    const bool beyond = number > nanosecondsBetween(first, Time::max()) / kIntervalCount;
     const auto time = static_cast<std::int64_t>(bits(first) + number * kIntervalCount);
     return {number, beyond ? Time::max() : Time(std::chrono::nanoseconds(time))};
 }

@@ -71,8 +71,7 @@ TEST(DisplayJson, KeepsUtf8AndReplacesEachInvalidByte) {
     EXPECT_EQ(json("\xC3"), "\"" + replaced + "\"") << "cut in the middle";
     EXPECT_EQ(json("\xC0\x80"), "\"" + replaced + replaced + "\"") << "overlong";
     EXPECT_EQ(json("\xED\xA0\x80"), "\"" + replaced + replaced + replaced + "\"") << "surrogate";
-    EXPECT_EQ(json("\xF4\x90\x80\x80"),
-              "\"" + replaced + replaced + replaced + replaced + "\"")
+    EXPECT_EQ(json("\xF4\x90\x80\x80"), "\"" + replaced + replaced + replaced + replaced + "\"")
         << "beyond U+10FFFF";
 }
 
@@ -113,8 +112,8 @@ TEST(DisplayJson, AnyNumberReadsBackAsItself) {
     EXPECT_TRUE(rc::check([](double number, std::int64_t integer) {
         RC_PRE(std::isfinite(number));
         RC_ASSERT(nlohmann::json::parse(json(PropertyList::real(number))).get<double>() == number);
-        RC_ASSERT(nlohmann::json::parse(json(PropertyList::integer(integer)))
-                      .get<std::int64_t>() == integer);
+        RC_ASSERT(nlohmann::json::parse(json(PropertyList::integer(integer))).get<std::int64_t>() ==
+                  integer);
     }));
 }
 

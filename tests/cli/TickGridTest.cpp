@@ -64,7 +64,7 @@ TEST(TickGrid, GivesWhatSteppingGives) {
         TickGrid grid;
         Time packet = kFirst;
         std::uint64_t passed = 0;
-        for (const std::int16_t step : steps) {
+        for (const std::int16_t& step : steps) {
             packet += milliseconds(step);
             if (&step == steps.data()) {
                 packet = kFirst;

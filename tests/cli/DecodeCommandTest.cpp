@@ -1,0 +1,240 @@
+#include "cli/DecodeCommand.h"
+
+#include "tests/cli/ScriptedRadio.h"
+#include "tests/doubles/FakeBundle.h"
+#include "tests/doubles/FakeResources.h"
+
+#include <gtest/gtest.h>
+
+#include <map>
+
+namespace pallax {
+namespace {
+
+using doubles::kFirstPacket;
+using doubles::ScriptedGenerator;
+using doubles::ScriptedRecording;
+using std::chrono::hours;
+using std::chrono::milliseconds;
+using std::chrono::seconds;
+using Packets = std::vector<ScriptedRecording::Packet>;
+
+class DecodeCommandTest : public testing::Test {
+protected:
+    DecodeCommandTest() { ScriptedGenerator::generations.clear(); }
+
+    void add(const std::string& name, Packets packets,
+             const RecordedTechnology* technology = &doubles::kScriptedLte,
+             std::optional<RecordingError> atEnd = std::nullopt) {
+        options.recordings.push_back(name);
+        recordings[name] = std::make_unique<ScriptedRecording>(name, std::move(packets), technology,
+                                                               std::move(atEnd));
+    }
+
+    ExitStatus run() {
+        const auto open = [this](const std::string& path) -> Recording::OpenResult {
+            const auto found = recordings.find(path);
+            if (found == recordings.end()) {
+                return RecordingError{RecordingError::Kind::CannotOpen, path + " is not there"};
+            }
+            return std::move(found->second);
+        };
+        const auto report = [this](std::string_view sentence) { reports.emplace_back(sentence); };
+        Output output([this](std::string_view block) { written += block; });
+        DecodeCommand command(options, {resources, bundle, notices, doubles::kScriptedTechnologies},
+                              open, report);
+        return command.run(output);
+    }
+
+    DecodeOptions options;
+    std::map<std::string, std::unique_ptr<Recording>> recordings;
+    std::string written;
+    std::vector<std::string> reports;
+    doubles::FakeResources resources;
+    doubles::FakeBundle bundle;
+    doubles::DroppedNotices notices;
+};
+
+TEST_F(DecodeCommandTest, EndGivesTheDisplayAfterTheLastPacket) {
+    add("a.pcap", {{milliseconds(0), "RSRP=-90dBm"}, {milliseconds(1), "RSRP=-94.75dBm"}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "{\"Cell\":{\"RSRP\":\"-94.75 dBm\"}}\n");
+    EXPECT_EQ(reports, std::vector<std::string>{});
+}
+
+TEST_F(DecodeCommandTest, TickGivesALineForEachTickThatSawNewData) {
+    options.every = Every::Tick;
+    add("a.pcap", {{milliseconds(0), "A=1"},
+                   {milliseconds(1999), "A=2"},
+                   {milliseconds(2000), "A=3"},
+                   {milliseconds(9000), "A=4"}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written,
+              R"({"tick":1,"time":"2023-11-14T22:13:22.000Z","display":{"Cell":{"A":"2"}}})"
+              "\n"
+              R"({"tick":2,"time":"2023-11-14T22:13:24.000Z","display":{"Cell":{"A":"3"}}})"
+              "\n"
+              R"({"tick":5,"time":"2023-11-14T22:13:30.000Z","display":{"Cell":{"A":"4"}}})"
+              "\n");
+}
+
+TEST_F(DecodeCommandTest, PacketGivesALineForEachPacket) {
+    options.every = Every::Packet;
+    add("a.pcap", {{milliseconds(0), "A=1"}, {milliseconds(1500), "A=2"}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written,
+              R"({"packet":1,"time":"2023-11-14T22:13:20.000Z","display":{"Cell":{"A":"1"}}})"
+              "\n"
+              R"({"packet":2,"time":"2023-11-14T22:13:21.500Z","display":{"Cell":{"A":"2"}}})"
+              "\n");
+}
+
+TEST_F(DecodeCommandTest, ARecordingWithoutPacketsHasNoDisplay) {
+    add("a.pcap", {});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "null\n");
+    EXPECT_TRUE(ScriptedGenerator::generations.empty());
+}
+
+TEST_F(DecodeCommandTest, EveryModeGeneratesTheDisplayAtTheTicksOfTheRecording) {
+    for (const Every every : {Every::End, Every::Tick, Every::Packet}) {
+        ScriptedGenerator::generations.clear();
+        options = {};
+        options.every = every;
+        add("a.pcap", {{milliseconds(0), "A=1"},
+                       {milliseconds(100), "A=2"},
+                       {hours(24 * 365 * 30), "A=3"},
+                       {milliseconds(50), "A=4"}});
+        EXPECT_EQ(run(), kExitSuccess);
+        EXPECT_EQ(ScriptedGenerator::generations,
+                  (std::vector<ScriptedGenerator::Generated>{
+                      {kFirstPacket + seconds(2), 6},
+                      {kFirstPacket + hours(24 * 365 * 30) + seconds(2), 6}}));
+    }
+}
+
+TEST_F(DecodeCommandTest, AStretchWithoutTicksDoesNotGrowWithoutBound) {
+    options.every = Every::Tick;
+    const std::string packet = "A=" + std::string((std::size_t{1} << 20U) - 2, 'x');
+    add("a.pcap", Packets(10, {milliseconds(0), packet}));
+    EXPECT_EQ(run(), kExitSuccess);
+    const std::size_t mebibyte = std::size_t{1} << 20U;
+    EXPECT_EQ(ScriptedGenerator::generations,
+              (std::vector<ScriptedGenerator::Generated>{{kFirstPacket, 5 * mebibyte},
+                                                         {kFirstPacket, 5 * mebibyte},
+                                                         {kFirstPacket + seconds(2), 0}}));
+    EXPECT_EQ(std::count(written.begin(), written.end(), '\n'), 1);
+}
+
+TEST_F(DecodeCommandTest, EachRecordingHasItsOwnStateAndNumbers) {
+    options.every = Every::Packet;
+    add("a.pcap", {{milliseconds(0), "A=1"}});
+    add("b.pcap", {{milliseconds(0), "B=2"}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written,
+              R"({"packet":1,"time":"2023-11-14T22:13:20.000Z","display":{"Cell":{"A":"1"}}})"
+              "\n"
+              R"({"packet":1,"time":"2023-11-14T22:13:20.000Z","display":{"Cell":{"B":"2"}}})"
+              "\n");
+}
+
+TEST_F(DecodeCommandTest, ARecordThatThrowsIsReportedAndSkipped) {
+    options.every = Every::Packet;
+    add("a.pcap",
+        {{milliseconds(0), "A=1"}, {milliseconds(1), "!a bad list"}, {milliseconds(2), "A=3"}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(reports, std::vector<std::string>{"a.pcap: packet 2: a bad list"});
+    EXPECT_EQ(written,
+              R"({"packet":1,"time":"2023-11-14T22:13:20.000Z","display":{"Cell":{"A":"1"}}})"
+              "\n"
+              R"({"packet":3,"time":"2023-11-14T22:13:20.002Z","display":{"Cell":{"A":"3"}}})"
+              "\n");
+}
+
+TEST_F(DecodeCommandTest, ATickWhosePacketsAllThrewSawNoNewData) {
+    options.every = Every::Tick;
+    add("a.pcap", {{milliseconds(0), "A=1"}, {seconds(2), "!bad"}, {seconds(5), "A=3"}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_NE(written.find("{\"tick\":1,"), std::string::npos);
+    EXPECT_EQ(written.find("{\"tick\":2,"), std::string::npos);
+    EXPECT_NE(written.find("{\"tick\":3,"), std::string::npos);
+}
+
+TEST_F(DecodeCommandTest, StrictStopsAtARecordThatThrows) {
+    options.strict = true;
+    options.every = Every::Packet;
+    add("a.pcap", {{milliseconds(0), "A=1"}, {milliseconds(1), "!bad"}, {milliseconds(2), "A=3"}});
+    add("b.pcap", {{milliseconds(0), "B=1"}});
+    EXPECT_EQ(run(), kExitFatalRecord);
+    EXPECT_EQ(reports, std::vector<std::string>{"a.pcap: packet 2: bad"});
+    EXPECT_EQ(written,
+              R"({"packet":1,"time":"2023-11-14T22:13:20.000Z","display":{"Cell":{"A":"1"}}})"
+              "\n");
+}
+
+TEST_F(DecodeCommandTest, ACutRecordingIsDecodedUpToTheCut) {
+    add("cut.pcap", {{milliseconds(0), "A=1"}}, &doubles::kScriptedLte,
+        RecordingError{RecordingError::Kind::CutShort, "cut.pcap ends in the middle of packet 2"});
+    add("b.pcap", {{milliseconds(0), "B=2"}});
+    EXPECT_EQ(run(), kExitFailure);
+    EXPECT_EQ(written, "{\"Cell\":{\"A\":\"1\"}}\n{\"Cell\":{\"B\":\"2\"}}\n");
+    EXPECT_EQ(reports, std::vector<std::string>{"cut.pcap ends in the middle of packet 2"});
+}
+
+TEST_F(DecodeCommandTest, AMissingRecordingDoesNotKeepTheOthersFromBeingDecoded) {
+    options.recordings.emplace_back("missing.pcap");
+    add("b.pcap", {{milliseconds(0), "B=2"}});
+    EXPECT_EQ(run(), kExitFailure);
+    EXPECT_EQ(written, "{\"Cell\":{\"B\":\"2\"}}\n");
+    EXPECT_EQ(reports, std::vector<std::string>{"missing.pcap is not there"});
+}
+
+TEST_F(DecodeCommandTest, AForeignLinkTypeNeedsTheTechnologyOption) {
+    add("foreign.pcap", {{milliseconds(0), "A=1"}}, nullptr);
+    EXPECT_EQ(run(), kExitFailure);
+    EXPECT_EQ(written, "");
+    EXPECT_EQ(reports, std::vector<std::string>{"foreign.pcap has a foreign link type"});
+
+    options = {};
+    options.technology = &doubles::kScriptedLte;
+    add("foreign.pcap", {{milliseconds(0), "A=1"}}, nullptr);
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "{\"Cell\":{\"A\":\"1\"}}\n");
+}
+
+TEST_F(DecodeCommandTest, ATechnologyWithoutAGeneratorIsNamed) {
+    add("c2k.pcap", {{milliseconds(0), "A=1"}}, &doubles::kUnknownToGenerators);
+    EXPECT_EQ(run(), kExitFailure);
+    EXPECT_EQ(reports, std::vector<std::string>{
+                           "c2k.pcap: there is no log generator for the technology Zorell_CDMA"});
+}
+
+TEST_F(DecodeCommandTest, CsvGivesARowForEachChangeFromTickToTick) {
+    options.every = Every::Tick;
+    options.format = DecodeFormat::Csv;
+    add("a.pcap", {{milliseconds(0), "State=Idle"},
+                   {milliseconds(1), "RSRP=-94.75dBm"},
+                   {seconds(2), "RSRP=-95dBm"},
+                   {seconds(4), "State"},
+                   {seconds(4), "Note=a,\"b\""}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "time,path,value,number,unit\n"
+                       "2023-11-14T22:13:22.000Z,/Cell/State,Idle,,\n"
+                       "2023-11-14T22:13:22.000Z,/Cell/RSRP,-94.75 dBm,-94.75,dBm\n"
+                       "2023-11-14T22:13:24.000Z,/Cell/RSRP,-95.00 dBm,-95.00,dBm\n"
+                       "2023-11-14T22:13:26.000Z,/Cell/Note,\"a,\"\"b\"\"\",,\n"
+                       "2023-11-14T22:13:26.000Z,/Cell/State,,,\n");
+}
+
+TEST_F(DecodeCommandTest, CsvAtTheEndGivesTheFinalValuesWithTheTimeOfTheLastPacket) {
+    options.format = DecodeFormat::Csv;
+    add("a.pcap", {{milliseconds(0), "A=1"}, {milliseconds(2500), "A=2"}});
+    add("b.pcap", {{milliseconds(0), "A=2"}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "time,path,value,number,unit\n"
+                       "2023-11-14T22:13:22.500Z,/Cell/A,2,,\n"
+                       "2023-11-14T22:13:20.000Z,/Cell/A,2,,\n");
+}
+
+} // namespace
+} // namespace pallax

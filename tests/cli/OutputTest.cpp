@@ -1,0 +1,56 @@
+#include "cli/Output.h"
+
+#include <gtest/gtest.h>
+
+#include <csignal>
+#include <fcntl.h>
+#include <unistd.h>
+
+namespace pallax {
+namespace {
+
+TEST(Output, HandsTextOnInBigBlocks) {
+    std::vector<std::size_t> blocks;
+    Output output([&blocks](std::string_view block) { blocks.push_back(block.size()); });
+    const std::string line(1000, 'x');
+    for (int count = 0; count < 100; ++count) {
+        output.text() += line;
+        output.lineDone();
+    }
+    output.flush();
+    output.flush();
+    EXPECT_EQ(blocks, (std::vector<std::size_t>{66000, 34000}));
+}
+
+TEST(Output, AFullDiskIsNamed) {
+    const int full = ::open("/dev/full", O_WRONLY | O_CLOEXEC);
+    ASSERT_GE(full, 0);
+    Output output(writeToDescriptor(full, "standard output"));
+    output.text() = "text";
+    try {
+        output.flush();
+        FAIL() << "nothing thrown";
+    } catch (const OutputFailure& failure) {
+        EXPECT_STREQ(failure.what(), "cannot write to standard output: No space left on device");
+    }
+    output.flush(); // what could not be written is not tried again
+    ::close(full);
+}
+
+TEST(Output, APipeThatNobodyReadsIsClosed) {
+    ::signal(SIGPIPE, SIG_IGN);
+    int pipe[2] = {};
+    ASSERT_EQ(::pipe(pipe), 0);
+    Output output(writeToDescriptor(pipe[1], "standard output"));
+    output.text() = "first";
+    output.flush();
+    char read[5] = {};
+    EXPECT_EQ(::read(pipe[0], read, sizeof read), 5);
+    ::close(pipe[0]);
+    output.text() = "second";
+    EXPECT_THROW(output.flush(), OutputClosed);
+    ::close(pipe[1]);
+}
+
+} // namespace
+} // namespace pallax
