@@ -1,5 +1,6 @@
 #include "cli/DecodeCommand.h"
 
+#include "cli/DroppedNotices.h"
 #include "tests/cli/ScriptedRadio.h"
 #include "tests/doubles/FakeBundle.h"
 #include "tests/doubles/FakeResources.h"
@@ -52,7 +53,7 @@ protected:
     std::vector<std::string> reports;
     doubles::FakeResources resources;
     doubles::FakeBundle bundle;
-    doubles::DroppedNotices notices;
+    DroppedNotices notices;
 };
 
 TEST_F(DecodeCommandTest, EndGivesTheDisplayAfterTheLastPacket) {

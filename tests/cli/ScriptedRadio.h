@@ -3,7 +3,6 @@
 #include "LogGenerator/LogGenerator.h"
 #include "host/Recording.h"
 #include "platform/Clock.h"
-#include "platform/StandardOutput.h"
 
 #include <chrono>
 #include <cstddef>
@@ -70,12 +69,6 @@ private:
     }
 
     std::size_t _captured = 0;
-};
-
-/// A standard output that nobody looks at.
-class DroppedNotices final : public StandardOutput {
-public:
-    void printLine(std::string_view /*line*/) override {}
 };
 
 inline constexpr Technology kScriptedTechnologies[] = {

@@ -1,0 +1,18 @@
+#pragma once
+
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+/// The system log goes to `sink` while this lives. The sink outlives it.
+class ScopedLog {
+public:
+    explicit ScopedLog(LogSink& sink, int threshold = SystemLog::kEverything) {
+        SystemLog::setSink(&sink, threshold);
+    }
+    ~ScopedLog() { SystemLog::setSink(nullptr); }
+    ScopedLog(const ScopedLog&) = delete;
+    ScopedLog& operator=(const ScopedLog&) = delete;
+};
+
+} // namespace pallax

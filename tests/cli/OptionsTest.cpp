@@ -1,0 +1,141 @@
+#include "cli/Options.h"
+
+#include <gtest/gtest.h>
+
+namespace pallax {
+namespace {
+
+template <class Wanted>
+Wanted parsed(std::vector<std::string> arguments) {
+    const ParsedOptions options = parseOptions(std::move(arguments));
+    if (const auto* end = std::get_if<ParseEnd>(&options)) {
+        ADD_FAILURE() << end->text;
+    }
+    const auto* wanted = std::get_if<Wanted>(&options);
+    EXPECT_NE(wanted, nullptr);
+    return wanted != nullptr ? *wanted : Wanted{};
+}
+
+ParseEnd ended(std::vector<std::string> arguments) {
+    const ParsedOptions options = parseOptions(std::move(arguments));
+    const auto* end = std::get_if<ParseEnd>(&options);
+    EXPECT_NE(end, nullptr);
+    return end != nullptr ? *end : ParseEnd{};
+}
+
+TEST(Options, WithoutArgumentsTheLiveModemIsBrowsed) {
+    const auto options = parsed<BrowseOptions>({});
+    EXPECT_EQ(options.recording, std::nullopt);
+    EXPECT_EQ(options.speed, PlaySpeed(1.0));
+    EXPECT_FALSE(options.loop);
+    EXPECT_FALSE(options.keepGoing);
+    EXPECT_EQ(options.logLevel, std::nullopt);
+}
+
+TEST(Options, ARecordingIsBrowsed) {
+    const auto options = parsed<BrowseOptions>(
+        {"drive.pcap", "--print", "--speed", "2.5", "--loop", "--keep-going", "--log-level", "4"});
+    EXPECT_EQ(options.recording, "drive.pcap");
+    EXPECT_TRUE(options.print);
+    EXPECT_EQ(options.speed, PlaySpeed(2.5));
+    EXPECT_TRUE(options.loop);
+    EXPECT_TRUE(options.keepGoing);
+    EXPECT_EQ(options.logLevel, 4);
+    EXPECT_EQ(parsed<BrowseOptions>({"--speed", "max", "-"}).speed, std::nullopt);
+    EXPECT_EQ(parsed<BrowseOptions>({"-"}).recording, "-");
+}
+
+TEST(Options, ARecordingNamedLikeACommandIsGivenWithItsFolder) {
+    EXPECT_EQ(parsed<BrowseOptions>({"./decode"}).recording, "./decode");
+}
+
+TEST(Options, DecodeWritesTheLastDisplayAsJsonUnlessToldOtherwise) {
+    const auto plain = parsed<DecodeOptions>({"decode", "a.pcap", "b.pcap"});
+    EXPECT_EQ(plain.recordings, (std::vector<std::string>{"a.pcap", "b.pcap"}));
+    EXPECT_EQ(plain.technology, nullptr);
+    EXPECT_EQ(plain.every, Every::End);
+    EXPECT_EQ(plain.format, DecodeFormat::Json);
+    EXPECT_EQ(plain.systemLog, std::nullopt);
+    EXPECT_FALSE(plain.strict);
+
+    const auto told =
+        parsed<DecodeOptions>({"decode", "--technology", "lte", "--every", "tick", "--format",
+                               "csv", "--system-log", "-", "--strict", "a.pcap"});
+    EXPECT_EQ(told.technology->identifier, "Zorell_LTE");
+    EXPECT_EQ(told.every, Every::Tick);
+    EXPECT_EQ(told.format, DecodeFormat::Csv);
+    EXPECT_EQ(told.systemLog, "-");
+    EXPECT_TRUE(told.strict);
+}
+
+TEST(Options, DecodeTakesEveryTechnology) {
+    for (const char* name : {"ifx", "gsm", "cdma", "lte", "utran"}) {
+        EXPECT_EQ(
+            parsed<DecodeOptions>({"decode", "--technology", name, "a"}).technology->commandName,
+            name);
+    }
+}
+
+TEST(Options, ServicePlaysARecording) {
+    const auto options =
+        parsed<ServiceOptions>({"service", "--play", "a.pcap", "--speed", "max", "--loop"});
+    EXPECT_EQ(options.recording, "a.pcap");
+    EXPECT_EQ(options.speed, std::nullopt);
+    EXPECT_TRUE(options.loop);
+}
+
+TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
+    for (const char* command : {"", "decode", "service"}) {
+        std::vector<std::string> arguments;
+        if (*command != '\0') {
+            arguments.emplace_back(command);
+        }
+        arguments.emplace_back("--version");
+        const ParseEnd version = ended(arguments);
+        EXPECT_EQ(version.status, kExitSuccess);
+        EXPECT_TRUE(version.text.starts_with("pallax ")) << version.text;
+        EXPECT_EQ(version.text.find('\n'), version.text.size() - 1);
+        arguments.back() = "--help";
+        const ParseEnd help = ended(arguments);
+        EXPECT_EQ(help.status, kExitSuccess);
+        EXPECT_NE(help.text.find("Examples:\n  pallax"), std::string::npos) << help.text;
+    }
+    EXPECT_NE(ended({"decode", "--help"}).text.find("--every end|tick|packet"), std::string::npos);
+}
+
+std::string wrongUsage(std::vector<std::string> arguments) {
+    const ParseEnd end = ended(std::move(arguments));
+    EXPECT_EQ(end.status, kExitWrongUsage);
+    EXPECT_EQ(end.text.find('\n'), end.text.size() - 1) << "one line: " << end.text;
+    return end.text;
+}
+
+TEST(Options, WrongUsageIsOneClearSentence) {
+    EXPECT_EQ(wrongUsage({"decode", "--every", "day", "a"}),
+              "pallax: --every: \"day\" is none of end|tick|packet (pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"--speed", "0", "a"}),
+              "pallax: --speed: \"0\" is neither a number above 0 nor max (pallax --help tells "
+              "more)\n");
+    EXPECT_EQ(wrongUsage({"decode"}), "pallax: RECORDING is required (pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"service"}), "pallax: --play is required (pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"a", "decode", "b"}),
+              "pallax: the command \"decode\" must come first, without options before it (pallax "
+              "--help tells more)\n");
+    EXPECT_EQ(wrongUsage({"--print", "decode", "b"}),
+              "pallax: the command \"decode\" must come first, without options before it (pallax "
+              "--help tells more)\n");
+}
+
+TEST(Options, WhatNobodyKnowsIsNamed) {
+    EXPECT_NE(wrongUsage({"--colour", "red"}).find("--colour"), std::string::npos);
+    EXPECT_NE(wrongUsage({"a.pcap", "b.pcap"}).find("b.pcap"), std::string::npos);
+    EXPECT_NE(wrongUsage({"--log-level", "8"}).find("--log-level"), std::string::npos);
+    EXPECT_NE(wrongUsage({"decode", "--technology", "5g", "a"}).find("ifx|gsm|cdma|lte|utran"),
+              std::string::npos);
+    for (const char* speed : {"-1", "nan", "inf", "fast", "1x", ""}) {
+        EXPECT_NE(wrongUsage({"--speed", speed, "a"}).find("--speed"), std::string::npos);
+    }
+}
+
+} // namespace
+} // namespace pallax
