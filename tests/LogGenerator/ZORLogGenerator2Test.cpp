@@ -57,11 +57,14 @@ public:
     const ClassIndex* index;
 
 private:
+    struct Held {
+        const ClassIndex* address;
+        std::unique_ptr<ProbeIndex> probes;
+    };
     ProbeGenerator(const GeneratorEnvironment& environment, std::unique_ptr<ProbeIndex> probes)
-        : ProbeGenerator(environment, probes.get(), std::move(probes)) {}
-    ProbeGenerator(const GeneratorEnvironment& environment, const ClassIndex* kept,
-                   std::unique_ptr<ProbeIndex> probes)
-        : ZORLogGenerator2(environment, {"PROBE", std::move(probes)}), index(kept) {}
+        : ProbeGenerator(environment, Held{probes.get(), std::move(probes)}) {}
+    ProbeGenerator(const GeneratorEnvironment& environment, Held held)
+        : ZORLogGenerator2(environment, {"PROBE", std::move(held.probes)}), index(held.address) {}
 };
 
 class ZORLogGenerator2Test : public testing::Test {
