@@ -1,0 +1,70 @@
+#include "LogGenerator/Common/CellMonitor.h"
+
+#include "platform/PropertyListCodec.h"
+#include "platform/SystemLog.h"
+#include "platform/TelephonyConstants.h"
+
+#include <algorithm>
+
+namespace pallax {
+
+namespace {
+
+bool holds(const Dictionary& cell, std::string_view key, std::string_view value) {
+    const PropertyList* found = cell.find(key);
+    return found != nullptr && found->string() == value;
+}
+
+} // namespace
+
+std::optional<Array> readCellMonitorArray(const LogRecord& record) {
+    const PropertyListResult parsed = parsePropertyList(record.payload());
+    if (!parsed) {
+        systemLog(LogPriority::Error, "Cell Info Array data could not be constructed");
+        return std::nullopt;
+    }
+    const ArrayRef cells = parsed->array();
+    return cells != nullptr ? *cells : Array();
+}
+
+void logNoCellArray() {
+    systemLog(LogPriority::Error, "Failed to get Cell Array\n");
+}
+
+bool isCell(const PropertyList& element, std::string_view radioAccessTechnology,
+            std::string_view cellType) {
+    const DictionaryRef cell = element.dictionary();
+    return cell != nullptr &&
+           holds(*cell, kHXCellMonitorCellRadioAccessTechnology, radioAccessTechnology) &&
+           holds(*cell, kHXCellMonitorCellType, cellType);
+}
+
+const PropertyList* findCell(const Array& cells, std::string_view radioAccessTechnology,
+                             std::string_view cellType) {
+    const auto found = std::find_if(cells.begin(), cells.end(), [&](const PropertyList& cell) {
+        return isCell(cell, radioAccessTechnology, cellType);
+    });
+    return found != cells.end() ? &*found : nullptr;
+}
+
+std::optional<std::int32_t> cellNumber(const PropertyList& cell, std::string_view key,
+                                       std::string_view failure) {
+    const DictionaryRef entries = cell.dictionary();
+    const PropertyList* value = entries != nullptr ? entries->find(key) : nullptr;
+    const auto number = value != nullptr ? value->int32() : std::nullopt;
+    if (!number) {
+        systemLog(LogPriority::Error, "%s", failure);
+    }
+    return number;
+}
+
+PropertyList cellLevel(std::int32_t number, const NumberFormat& format, int factor) {
+    constexpr std::int16_t kNotMeasured = 32767;
+    const auto level = static_cast<std::int16_t>(number);
+    if (level == kNotMeasured) {
+        return Text::fixed("");
+    }
+    return DisplayNumber(std::int64_t{level} * factor, format);
+}
+
+} // namespace pallax

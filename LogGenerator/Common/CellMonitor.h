@@ -1,0 +1,40 @@
+#pragma once
+
+#include "LogGenerator/Records/LogRecord.h"
+#include "platform/PropertyList.h"
+
+#include <cstdint>
+#include <optional>
+#include <string_view>
+
+/// The cell-monitor array: behind the header of the extended record 0xFF0001 stands a serialized
+/// property list, an array of dictionaries, one for each cell that the telephony service knows,
+/// keyed by its `kHXCellMonitor…` constants.
+namespace pallax {
+
+/// The array's elements; none when the root is no array. Nothing, with "Cell Info Array data could
+/// not be constructed" in the log, when the payload is no property list.
+std::optional<Array> readCellMonitorArray(const LogRecord& record);
+
+/// "Failed to get Cell Array\n": the second line of most records whose array could not be read.
+void logNoCellArray();
+
+/// True for a cell of that radio access technology and cell type; an element that lacks either
+/// key, or is no dictionary, is none.
+bool isCell(const PropertyList& element, std::string_view radioAccessTechnology,
+            std::string_view cellType);
+
+/// The first such cell, or null.
+const PropertyList* findCell(const Array& cells, std::string_view radioAccessTechnology,
+                             std::string_view cellType);
+
+/// The cell's number under `key` as a signed 32-bit integer. Nothing, with `failure` in the log at
+/// error priority, when it is missing or no such number.
+std::optional<std::int32_t> cellNumber(const PropertyList& cell, std::string_view key,
+                                       std::string_view failure);
+
+/// A level as the cell monitor reports it: the low 16 bits, signed, times `factor`, under
+/// `format`; the empty string for 32767, which stands for "not measured".
+PropertyList cellLevel(std::int32_t number, const NumberFormat& format, int factor = 1);
+
+} // namespace pallax

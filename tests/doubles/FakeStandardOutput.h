@@ -1,0 +1,18 @@
+#pragma once
+
+#include "platform/StandardOutput.h"
+
+#include <string>
+#include <vector>
+
+namespace pallax::doubles {
+
+/// Keeps the lines that were printed.
+class FakeStandardOutput final : public StandardOutput {
+public:
+    void printLine(std::string_view line) override { lines.emplace_back(line); }
+
+    std::vector<std::string> lines;
+};
+
+} // namespace pallax::doubles

@@ -1,0 +1,21 @@
+#pragma once
+
+#include "LogGenerator/LogGenerator.h"
+#include "tests/doubles/FakeBundle.h"
+#include "tests/doubles/FakeResources.h"
+#include "tests/doubles/FakeStandardOutput.h"
+#include "tests/doubles/ManualClock.h"
+
+namespace pallax::doubles {
+
+/// Everything that a generator needs, as fakes.
+struct GeneratorFixture {
+    ManualClock clock;
+    FakeResources resources;
+    FakeBundle bundle;
+    FakeStandardOutput standardOutput;
+
+    GeneratorEnvironment environment() { return {clock, resources, bundle, standardOutput}; }
+};
+
+} // namespace pallax::doubles
