@@ -1,0 +1,66 @@
+#pragma once
+
+#include "platform/MainQueue.h"
+#include "platform/RepeatingTimer.h"
+
+#include <chrono>
+#include <functional>
+#include <initializer_list>
+#include <memory>
+
+namespace pallax {
+
+/// The main queue and its timers, on Asio. Blocks, timers, signals and descriptor watches all run
+/// inside `run`, on the thread that calls it; only `async` may be called from another thread.
+class AsioMainQueue final : public MainQueue, public TimerScheduler {
+public:
+    AsioMainQueue();
+    ~AsioMainQueue() override;
+    AsioMainQueue(const AsioMainQueue&) = delete;
+    AsioMainQueue& operator=(const AsioMainQueue&) = delete;
+
+    void async(Block block) override;
+    void after(std::chrono::nanoseconds delay, Block block) override;
+    /// A firing that the queue was too busy for is left out; the later ones keep to the grid.
+    std::unique_ptr<RepeatingTimer> scheduleRepeating(std::chrono::nanoseconds interval,
+                                                      std::function<void()> action) override;
+
+    /// Runs blocks, waiting for them, until `stop`. An exception of a block leaves through here;
+    /// run may then be called again and goes on with the next block.
+    void run();
+    /// Runs what is ready now, without waiting; what those blocks post included.
+    void runReady();
+    /// Makes `run` return after the present block, or the next `run` return at once.
+    void stop();
+
+    /// Calls `action` as a block for each of these signals, instead of what they do by default.
+    /// A later call replaces an earlier one.
+    void onSignal(std::initializer_list<int> signals, std::function<void(int)> action);
+
+private:
+    friend class DescriptorWatch;
+    struct Impl;
+    std::unique_ptr<Impl> _impl;
+};
+
+/// Waits for a file descriptor that somebody else owns; to be destroyed before the descriptor is
+/// closed. Its destruction drops what is being waited for.
+class DescriptorWatch {
+public:
+    /// Throws std::system_error for a descriptor that cannot be waited for.
+    DescriptorWatch(AsioMainQueue& queue, int descriptor);
+    ~DescriptorWatch();
+    DescriptorWatch(const DescriptorWatch&) = delete;
+    DescriptorWatch& operator=(const DescriptorWatch&) = delete;
+
+    /// Calls `action` once, as a block, when there is something to read (the end included).
+    void onceReadable(std::function<void()> action);
+    /// Calls `action` once, as a block, when there is room to write.
+    void onceWritable(std::function<void()> action);
+
+private:
+    struct State;
+    std::shared_ptr<State> _state;
+};
+
+} // namespace pallax

@@ -1,0 +1,61 @@
+#include "host/DirectoryResources.h"
+
+#include "host/Files.h"
+#include "platform/PropertyListCodec.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <filesystem>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kExtension = ".plist";
+
+} // namespace
+
+std::string DirectoryResources::programFolder() {
+    const char* chosen = std::getenv("PALLAX_RESOURCES"); // NOLINT(concurrency-mt-unsafe)
+    if (chosen != nullptr && *chosen != '\0') {
+        return chosen;
+    }
+    std::error_code error;
+    const auto program = std::filesystem::read_symlink("/proc/self/exe", error);
+    const auto installed = program.parent_path().parent_path() / "share" / "pallax";
+#ifdef PALLAX_SOURCE_RESOURCES
+    if (!std::filesystem::is_directory(installed, error)) {
+        return PALLAX_SOURCE_RESOURCES;
+    }
+#endif
+    return installed.native();
+}
+
+std::optional<PropertyList> DirectoryResources::propertyList(std::string_view name) const {
+    if (name.empty() || name.find('/') != std::string_view::npos) {
+        return std::nullopt;
+    }
+    const auto content =
+        readFile(_folder + "/" + std::string(name) + std::string(kExtension), kLargestPropertyList);
+    auto parsed = parsePropertyList(content ? Bytes(*content) : Bytes());
+    return parsed ? std::optional(std::move(parsed).value()) : std::nullopt;
+}
+
+std::vector<std::string> DirectoryResources::propertyListPaths() const {
+    namespace fs = std::filesystem;
+    std::vector<std::string> paths;
+    std::error_code error;
+    constexpr auto kOptions = fs::directory_options::skip_permission_denied;
+    fs::recursive_directory_iterator entry(_folder, kOptions, error);
+    while (!error && entry != fs::recursive_directory_iterator()) {
+        std::error_code ignored;
+        if (entry->path().extension() == kExtension && entry->is_regular_file(ignored)) {
+            paths.push_back(entry->path().native());
+        }
+        entry.increment(error);
+    }
+    std::sort(paths.begin(), paths.end());
+    return paths;
+}
+
+} // namespace pallax

@@ -1,0 +1,73 @@
+#include "host/Files.h"
+
+#include "host/Descriptor.h"
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <cstdio>
+#include <cstdlib>
+#include <fcntl.h>
+#include <sys/stat.h>
+
+namespace pallax {
+
+namespace {
+
+constexpr mode_t kFileMode = S_IRUSR | S_IWUSR | S_IRGRP | S_IROTH; // less the user's mask
+
+bool writeAll(const Descriptor& file, std::string_view content) {
+    while (!content.empty()) {
+        const ssize_t written = ::write(file.number(), content.data(), content.size());
+        if (written < 0 && errno != EINTR) {
+            return false;
+        }
+        content.remove_prefix(written > 0 ? static_cast<std::size_t>(written) : 0);
+    }
+    return true;
+}
+
+} // namespace
+
+std::optional<ByteBuffer> readFile(const std::string& path, std::size_t largest) {
+    const Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC));
+    ByteBuffer content;
+    constexpr std::size_t kPiece = std::size_t{64} << 10U;
+    std::array<std::uint8_t, kPiece> piece; // NOLINT: filled by the call below
+    while (file) {
+        const ssize_t count = ::read(file.number(), piece.data(), piece.size());
+        if (count == 0) {
+            return content;
+        }
+        if (count < 0 && errno != EINTR) {
+            break;
+        }
+        content.insert(content.end(), piece.begin(), piece.begin() + std::max<ssize_t>(count, 0));
+        if (content.size() > largest) {
+            break;
+        }
+    }
+    return std::nullopt;
+}
+
+bool writeFile(const std::string& path, std::string_view content) {
+    const Descriptor file(
+        ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, kFileMode));
+    return file && writeAll(file, content);
+}
+
+bool replaceFile(const std::string& path, std::string_view content) {
+    std::string temporary = path + ".XXXXXX";
+    const Descriptor file(::mkostemp(temporary.data(), O_CLOEXEC));
+    if (!file) {
+        return false;
+    }
+    const bool done = writeAll(file, content) && ::fsync(file.number()) == 0 &&
+                      std::rename(temporary.c_str(), path.c_str()) == 0;
+    if (!done) {
+        (void)::unlink(temporary.c_str());
+    }
+    return done;
+}
+
+} // namespace pallax

@@ -1,0 +1,20 @@
+#include "host/HostFileSystem.h"
+
+#include "host/Files.h"
+#include "platform/PropertyListCodec.h"
+
+#include <filesystem>
+
+namespace pallax {
+
+bool HostFileSystem::exists(const std::string& path) const {
+    std::error_code error;
+    return std::filesystem::exists(path, error);
+}
+
+bool HostFileSystem::writePropertyList(const std::string& path, const PropertyList& object) {
+    const auto text = serializeXml(object);
+    return text && writeFile(path, *text);
+}
+
+} // namespace pallax

@@ -1,0 +1,64 @@
+#include "host/LogSinks.h"
+
+#include <cerrno>
+#include <cstring>
+#include <syslog.h>
+
+namespace pallax {
+
+namespace {
+
+void writeTo(std::FILE* file, LogPriority priority, std::string_view text) {
+    const std::string line = logLine(priority, text);
+    (void)std::fwrite(line.data(), 1, line.size(), file); // a failure stays with the stream
+}
+
+} // namespace
+
+std::string logLine(LogPriority priority, std::string_view text) {
+    std::string line = formatText("<%d>%@", {static_cast<int>(priority), text});
+    if (!text.ends_with('\n')) {
+        line += '\n';
+    }
+    return line;
+}
+
+SyslogSink::SyslogSink(std::string identity) : _identity(std::move(identity)) {
+    ::openlog(_identity.c_str(), LOG_PID, LOG_USER);
+}
+
+SyslogSink::~SyslogSink() {
+    ::closelog();
+}
+
+void SyslogSink::write(LogPriority priority, std::string_view text) {
+    const int length = static_cast<int>(text.size());
+    ::syslog(static_cast<int>(priority), "%.*s", length, text.data()); // NOLINT: syslog's way
+}
+
+void StderrSink::write(LogPriority priority, std::string_view text) {
+    writeTo(stderr, priority, text);
+}
+
+Result<std::unique_ptr<FileSink>, HostError> FileSink::create(const std::string& path) {
+    std::FILE* file = std::fopen(path.c_str(), "we");
+    if (file == nullptr) {
+        return HostError{
+            formatText("The log file %@ cannot be written: %@.", {path, std::strerror(errno)})};
+    }
+    return std::unique_ptr<FileSink>(new FileSink(file));
+}
+
+FileSink::~FileSink() {
+    (void)std::fclose(_file);
+}
+
+void FileSink::write(LogPriority priority, std::string_view text) {
+    writeTo(_file, priority, text);
+}
+
+bool FileSink::flush() {
+    return std::fflush(_file) == 0 && std::ferror(_file) == 0;
+}
+
+} // namespace pallax

@@ -1,0 +1,157 @@
+// The reader of recordings, on libpcap.
+
+#include "host/Recording.h"
+#include "platform/Format.h"
+
+#include <pcap/pcap.h>
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <cstdio>
+#include <cstring>
+#include <string_view>
+#include <sys/stat.h>
+
+namespace pallax {
+
+namespace {
+
+using Kind = RecordingError::Kind;
+
+RecordingError errorOf(Kind kind, const std::string& name, std::string_view what) {
+    return {kind, formatText("%@ %@.", {name, what})};
+}
+
+class PcapRecording final : public Recording {
+public:
+    PcapRecording(std::string name, pcap_t* capture)
+        : _name(std::move(name)), _capture(capture), _linkType(pcap_datalink(capture)) {}
+    ~PcapRecording() override { pcap_close(_capture); }
+    PcapRecording(const PcapRecording&) = delete;
+    PcapRecording& operator=(const PcapRecording&) = delete;
+
+    const std::string& name() const override { return _name; }
+    int linkType() const override { return _linkType; }
+    const RecordedTechnology* technology() const override {
+        return technologyOfLinkType(_linkType);
+    }
+    RecordingError foreignLinkType() const override;
+    std::optional<RecordedPacket> next() override;
+    const std::optional<RecordingError>& error() const override { return _error; }
+
+private:
+    std::string _name;
+    pcap_t* _capture;
+    int _linkType;
+    std::optional<RecordingError> _error;
+    bool _ended = false;
+};
+
+RecordingError PcapRecording::foreignLinkType() const {
+    std::string known;
+    for (const RecordedTechnology& technology : recordedTechnologies()) {
+        const bool last = &technology == &recordedTechnologies().back();
+        known += known.empty() ? "" : last ? " and " : ", ";
+        known += formatText("%d (%@)", {technology.linkType, technology.commandName});
+    }
+    return errorOf(Kind::UnknownLinkType, _name,
+                   formatText("has the link type %d, which is no radio modem's; known are %@",
+                              {_linkType, known}));
+}
+
+/// A moment of any file, bounded to what a Time can hold.
+Time timeOf(const timeval& stamp) {
+    constexpr std::int64_t kLatestSecond = 9'000'000'000; // in the year 2255
+    const std::int64_t seconds = std::clamp<std::int64_t>(stamp.tv_sec, 0, kLatestSecond);
+    // Opened for nanoseconds, which then stand in the field for microseconds.
+    const std::int64_t nanoseconds = std::clamp<std::int64_t>(stamp.tv_usec, 0, 999'999'999);
+    return Time(std::chrono::seconds(seconds) + std::chrono::nanoseconds(nanoseconds));
+}
+
+std::optional<RecordedPacket> PcapRecording::next() {
+    pcap_pkthdr* header = nullptr;
+    const u_char* data = nullptr;
+    const int status = _ended ? PCAP_ERROR_BREAK : pcap_next_ex(_capture, &header, &data);
+    if (status == 1) {
+        return RecordedPacket{timeOf(header->ts), Bytes(data, header->caplen)};
+    }
+    if (status == PCAP_ERROR) {
+        // A read that met the end of the file in the middle of something.
+        const bool cut = std::feof(pcap_file(_capture)) != 0;
+        _error = cut ? errorOf(Kind::CutShort, _name, "ends in the middle of a packet")
+                     : errorOf(Kind::Unreadable, _name,
+                               formatText("cannot be read on: %@", {pcap_geterr(_capture)}));
+    }
+    _ended = true;
+    return std::nullopt;
+}
+
+/// Opens the file for reading, or says why not.
+Result<std::FILE*, RecordingError> openFile(const std::string& path, const std::string& name) {
+    std::FILE* file = path == "-" ? stdin : std::fopen(path.c_str(), "rbe");
+    struct stat status {};
+    std::string_view reason;
+    if (file == nullptr) {
+        reason = std::strerror(errno);
+    } else if (::fstat(::fileno(file), &status) != 0) {
+        reason = std::strerror(errno);
+    } else if (S_ISDIR(status.st_mode)) {
+        reason = "it is a folder";
+    }
+    if (reason.empty()) {
+        return file;
+    }
+    if (file != nullptr && file != stdin) {
+        (void)std::fclose(file);
+    }
+    return errorOf(Kind::CannotOpen, name, formatText("cannot be opened: %@", {reason}));
+}
+
+RecordingError noCapture(std::FILE* file, const std::string& name, std::string_view reason) {
+    if (std::ferror(file) != 0) {
+        return errorOf(Kind::Unreadable, name, formatText("cannot be read: %@", {reason}));
+    }
+    if (std::feof(file) != 0) {
+        return errorOf(Kind::NoCapture, name,
+                       "is no recording: it ends before the header of a capture is whole");
+    }
+    if (reason.find("unknown file format") != std::string_view::npos) {
+        return errorOf(Kind::NoCapture, name, "is no recording: it is neither pcap nor pcapng");
+    }
+    return errorOf(Kind::Unreadable, name, formatText("cannot be read: %@", {reason}));
+}
+
+} // namespace
+
+Recording::OpenResult Recording::open(const std::string& path) {
+    const std::string name = path == "-" ? "standard input" : path;
+    const auto opened = openFile(path, name);
+    if (!opened) {
+        return opened.error();
+    }
+    std::FILE* file = *opened;
+    const auto failed = [file](RecordingError error) {
+        if (file != stdin) {
+            (void)std::fclose(file);
+        }
+        return error;
+    };
+    const int first = std::fgetc(file);
+    if (first == EOF) {
+        return failed(std::ferror(file) != 0
+                          ? errorOf(Kind::CannotOpen, name,
+                                    formatText("cannot be read: %@", {std::strerror(errno)}))
+                          : errorOf(Kind::Empty, name, "is empty"));
+    }
+    (void)std::ungetc(first, file);
+    std::array<char, PCAP_ERRBUF_SIZE> reason{};
+    pcap_t* capture =
+        pcap_fopen_offline_with_tstamp_precision(file, PCAP_TSTAMP_PRECISION_NANO, reason.data());
+    if (capture == nullptr) {
+        return failed(noCapture(file, name, reason.data()));
+    }
+    return std::unique_ptr<Recording>(std::make_unique<PcapRecording>(name, capture));
+}
+
+} // namespace pallax

@@ -1,0 +1,89 @@
+#pragma once
+
+#include "platform/Bytes.h"
+#include "platform/Date.h"
+
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <string_view>
+
+/// How messages are framed on a message port's socket, little-endian:
+///
+///   offset  width  field
+///   0       4      magic, "PLXM"
+///   4       2      kind, see FrameKind
+///   6       2      reserved, zero
+///   8       4      message identifier, signed
+///   12      4      length of the data that follows the header, at most 16 MiB
+///   16      8      source time: signed nanoseconds since the epoch; the smallest number: none
+///   24      4      request number: a reply carries that of its request; otherwise zero
+///   28      4      reserved, zero
+///
+/// A peer that sends anything else is cut off.
+namespace pallax {
+
+enum class FrameKind : std::uint16_t {
+    Message = 1, ///< no reply wanted
+    Request = 2, ///< a reply is wanted
+    Reply = 3,
+    NoReply = 4, ///< the receiver of a request has nothing to answer
+    Clock = 5,   ///< no data: the source's clock stands at the source time
+    End = 6,     ///< no data: the source has come to its end
+};
+
+inline constexpr std::size_t kFrameHeaderSize = 32;
+inline constexpr std::size_t kLargestMessage = std::size_t{16} << 20U;
+
+/// A frame without its data.
+struct FrameHeader {
+    FrameKind kind = FrameKind::Message;
+    std::int32_t identifier = 0;
+    std::uint32_t requestNumber = 0;
+    std::optional<Time> sourceTime;
+
+    friend bool operator==(const FrameHeader&, const FrameHeader&) = default;
+};
+
+struct PortFrame {
+    FrameHeader header;
+    ByteBuffer data;
+
+    friend bool operator==(const PortFrame&, const PortFrame&) = default;
+};
+
+/// The header of a frame whose data has `length` bytes (at most kLargestMessage).
+std::array<std::uint8_t, kFrameHeaderSize> encodeHeader(const FrameHeader& header,
+                                                        std::size_t length);
+/// Appends a whole frame.
+void appendFrame(ByteBuffer& out, const FrameHeader& header, Bytes data);
+
+/// Puts frames together from whatever pieces a socket gives. It never holds more memory than
+/// twice what it was fed of the present frame, whatever length the header claims.
+class PortFrameParser {
+public:
+    /// Takes bytes from the front of `bytes`, up to the end of one frame, and says how many. It
+    /// takes none while a whole frame waits to be taken, and none after a fault.
+    std::size_t feed(Bytes bytes);
+    /// The frame that has become whole, once.
+    std::optional<PortFrame> take();
+    /// What the peer did wrong ("an unknown kind of frame"); empty while nothing.
+    std::string_view fault() const { return _fault; }
+    /// True in the middle of a frame: a stream that ends here is cut.
+    bool isInsideFrame() const { return _headerSize > 0 && !_whole; }
+
+private:
+    std::size_t feedHeader(Bytes bytes);
+    std::size_t feedData(Bytes bytes);
+    void decodeHeader();
+
+    std::array<std::uint8_t, kFrameHeaderSize> _headerBytes{};
+    std::size_t _headerSize = 0;
+    std::size_t _length = 0; // of the data, once the header is whole
+    PortFrame _frame;
+    bool _whole = false;
+    std::string_view _fault;
+};
+
+} // namespace pallax

@@ -1,0 +1,41 @@
+#include "host/Recording.h"
+
+#include "platform/TelephonyConstants.h"
+
+#include <algorithm>
+#include <array>
+
+namespace pallax {
+
+namespace {
+
+// The link types are those that capture files reserve for private use, from USER0 on.
+constexpr std::array<RecordedTechnology, 5> kTechnologies = {{
+    {147, kHXLogChannelTechnology_IFX, "ifx"},
+    {148, kHXLogChannelTechnology_Zorell_GSM, "gsm"},
+    {149, kHXLogChannelTechnology_Zorell_CDMA, "cdma"},
+    {150, kHXLogChannelTechnology_Zorell_LTE, "lte"},
+    {151, kHXLogChannelTechnology_Zorell_UTRAN2, "utran"},
+}};
+
+template <class Matches>
+const RecordedTechnology* firstThat(Matches matches) {
+    const auto* found = std::find_if(kTechnologies.begin(), kTechnologies.end(), matches);
+    return found != kTechnologies.end() ? found : nullptr;
+}
+
+} // namespace
+
+std::span<const RecordedTechnology> recordedTechnologies() {
+    return kTechnologies;
+}
+
+const RecordedTechnology* technologyOfLinkType(int linkType) {
+    return firstThat([&](const RecordedTechnology& each) { return each.linkType == linkType; });
+}
+
+const RecordedTechnology* technologyOfCommandName(std::string_view name) {
+    return firstThat([&](const RecordedTechnology& each) { return each.commandName == name; });
+}
+
+} // namespace pallax

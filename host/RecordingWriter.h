@@ -1,0 +1,42 @@
+#pragma once
+
+#include "host/HostError.h"
+#include "platform/Bytes.h"
+#include "platform/Date.h"
+#include "platform/Result.h"
+
+#include <cstdio>
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace pallax {
+
+/// Writes a recording: pcap with nanosecond stamps, little-endian on every machine, so the same
+/// packets give the same bytes. Each packet reaches the file before the next is taken: a crash
+/// loses at most the last one.
+class RecordingWriter {
+public:
+    /// The largest packet that readers of captures accept.
+    static constexpr std::size_t kLargestPacket = 262144;
+
+    /// An existing file is replaced; `path` "-" is standard output.
+    static Result<std::unique_ptr<RecordingWriter>, HostError> create(const std::string& path,
+                                                                      int linkType);
+    ~RecordingWriter();
+    RecordingWriter(const RecordingWriter&) = delete;
+    RecordingWriter& operator=(const RecordingWriter&) = delete;
+
+    /// Nothing when the packet is written; else why it is not, and the recording is as before
+    /// where the packet was refused for its size or time (1970 to 2106).
+    std::optional<HostError> write(Time time, Bytes packet);
+
+private:
+    RecordingWriter(std::string name, std::FILE* file) : _name(std::move(name)), _file(file) {}
+    std::optional<HostError> put(const ByteBuffer& bytes);
+
+    std::string _name;
+    std::FILE* _file;
+};
+
+} // namespace pallax

@@ -1,0 +1,50 @@
+#pragma once
+
+#include "host/Descriptor.h"
+#include "host/SocketDirectory.h"
+#include "platform/MessagePort.h"
+
+#include <memory>
+#include <string>
+
+namespace pallax {
+
+class AsioMainQueue;
+class SourceTimeListener;
+
+/// A named port: a listening socket and the connections that were made to it. Its destruction
+/// ends it without a call of the invalidation callback.
+class SocketLocalPort final : public LocalMessagePort {
+public:
+    struct Setup {
+        AsioMainQueue& queue;
+        SocketDirectory directory;
+        std::string path;
+        Descriptor listener; ///< listens at `path`
+        MessagePorts::ReceiveCallback receive;
+        SourceTimeListener* times; ///< may be null
+    };
+
+    /// An inert port: it never was valid.
+    SocketLocalPort() = default;
+    explicit SocketLocalPort(Setup setup);
+    ~SocketLocalPort() override;
+    SocketLocalPort(const SocketLocalPort&) = delete;
+    SocketLocalPort& operator=(const SocketLocalPort&) = delete;
+
+    void setInvalidationCallback(InvalidationCallback callback) override;
+    void invalidate() override;
+    bool isValid() const override { return _state != nullptr; }
+    void setDispatchQueue(MainQueue& queue) override;
+
+private:
+    struct State;
+    class Session;
+
+    void close();
+
+    std::shared_ptr<State> _state; // null once the port has ended
+    InvalidationCallback _invalidated;
+};
+
+} // namespace pallax

@@ -1,0 +1,36 @@
+#pragma once
+
+#include "host/SocketDirectory.h"
+#include "platform/MessagePort.h"
+
+#include <string>
+
+namespace pallax {
+
+class AsioMainQueue;
+class SourceTimeListener;
+
+/// Named message ports as Unix-domain sockets. A port's messages are read only as fast as they
+/// are processed, so a slow receiver slows its senders down. What a port does besides delivering
+/// messages happens on `queue`. Queue and listener outlive the ports made here.
+class SocketMessagePorts final : public MessagePorts {
+public:
+    /// `listener`, which may be null, hears the source times of what arrives on local ports.
+    SocketMessagePorts(AsioMainQueue& queue, SocketDirectory directory,
+                       SourceTimeListener* listener = nullptr);
+
+    Local createLocal(std::string_view name, ReceiveCallback receive) override;
+    std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override;
+
+    /// Why the latest createLocal gave no port: one sentence.
+    const std::string& lastError() const { return _lastError; }
+    const SocketDirectory& directory() const { return _directory; }
+
+private:
+    AsioMainQueue& _queue;
+    SocketDirectory _directory;
+    SourceTimeListener* _listener;
+    std::string _lastError;
+};
+
+} // namespace pallax

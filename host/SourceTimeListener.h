@@ -1,0 +1,21 @@
+#pragma once
+
+#include "platform/Date.h"
+
+namespace pallax {
+
+/// Hears the source times that arrive on a local port, in order.
+class SourceTimeListener {
+public:
+    virtual ~SourceTimeListener() = default;
+    /// A new connection begins to tell the time; its times need not follow the earlier ones.
+    virtual void sourceBegan() = 0;
+    /// One step towards `time`. True: something fell due before it and was done; what that
+    /// posted on the main queue comes first, then this is to be called again from a later block.
+    /// False: the clock stands at `time`.
+    virtual bool advance(Time time) = 0;
+    /// The source has come to its end.
+    virtual void sourceEnded() = 0;
+};
+
+} // namespace pallax

@@ -1,0 +1,125 @@
+#include "host/UnixSocket.h"
+
+#include <array>
+#include <cerrno>
+#include <cstring>
+#include <sys/socket.h>
+#include <sys/stat.h>
+#include <sys/uio.h>
+#include <sys/un.h>
+
+namespace pallax {
+
+namespace {
+
+constexpr int kSocketType = SOCK_STREAM | SOCK_NONBLOCK | SOCK_CLOEXEC;
+constexpr int kBacklog = 64;
+
+/// Nothing when the path is too long.
+std::optional<sockaddr_un> addressOf(const std::string& path) {
+    sockaddr_un address{};
+    if (path.size() > longestSocketPath()) {
+        errno = ENAMETOOLONG;
+        return std::nullopt;
+    }
+    address.sun_family = AF_UNIX;
+    std::memcpy(static_cast<void*>(address.sun_path), path.c_str(), path.size() + 1);
+    return address;
+}
+
+const sockaddr* generic(const sockaddr_un& address) {
+    return static_cast<const sockaddr*>(static_cast<const void*>(&address));
+}
+
+bool isOfThisUser(const Descriptor& socket) {
+    ucred credentials{};
+    socklen_t size = sizeof credentials;
+    return ::getsockopt(socket.number(), SOL_SOCKET, SO_PEERCRED, &credentials, &size) == 0 &&
+           credentials.uid == ::geteuid();
+}
+
+Transfer outcome(ssize_t moved) {
+    if (moved > 0) {
+        return {Transfer::State::Moved, static_cast<std::size_t>(moved)};
+    }
+    const bool later = moved < 0 && (errno == EAGAIN || errno == EWOULDBLOCK || errno == EINTR);
+    return {later ? Transfer::State::WouldBlock : Transfer::State::Closed, 0};
+}
+
+} // namespace
+
+std::size_t longestSocketPath() {
+    return sizeof(sockaddr_un::sun_path) - 1;
+}
+
+Listener listenerAt(const std::string& path) {
+    const auto address = addressOf(path);
+    const Descriptor probe(::socket(AF_UNIX, kSocketType, 0));
+    if (!address || !probe) {
+        return Listener::None;
+    }
+    // EAGAIN: it listens, but its queue of connections is full.
+    if (::connect(probe.number(), generic(*address), sizeof *address) == 0 || errno == EAGAIN) {
+        return Listener::Living;
+    }
+    return errno == ENOENT ? Listener::None : Listener::Stale;
+}
+
+Descriptor listenAt(const std::string& path) {
+    const auto address = addressOf(path);
+    Descriptor listener(::socket(AF_UNIX, kSocketType, 0));
+    if (!address || !listener ||
+        ::bind(listener.number(), generic(*address), sizeof *address) != 0) {
+        return {};
+    }
+    if (::chmod(path.c_str(), S_IRUSR | S_IWUSR) != 0 ||
+        ::listen(listener.number(), kBacklog) != 0) {
+        const int error = errno;
+        (void)::unlink(path.c_str());
+        errno = error;
+        return {};
+    }
+    return listener;
+}
+
+Descriptor connectTo(const std::string& path) {
+    const auto address = addressOf(path);
+    Descriptor socket(::socket(AF_UNIX, kSocketType, 0));
+    if (!address || !socket ||
+        ::connect(socket.number(), generic(*address), sizeof *address) != 0 ||
+        !isOfThisUser(socket)) {
+        return {};
+    }
+    return socket;
+}
+
+Descriptor acceptFrom(const Descriptor& listener) {
+    for (;;) {
+        Descriptor socket(
+            ::accept4(listener.number(), nullptr, nullptr, SOCK_NONBLOCK | SOCK_CLOEXEC));
+        if (!socket && (errno == ECONNABORTED || errno == EINTR)) {
+            continue;
+        }
+        if (!socket || isOfThisUser(socket)) {
+            return socket;
+        }
+    }
+}
+
+Transfer receiveFrom(const Descriptor& socket, std::span<std::uint8_t> buffer) {
+    return outcome(::recv(socket.number(), buffer.data(), buffer.size(), 0));
+}
+
+Transfer sendTo(const Descriptor& socket, Bytes first, Bytes second) {
+    // The kernel reads only; its structure has no const.
+    const auto part = [](Bytes bytes) {
+        return iovec{const_cast<std::uint8_t*>(bytes.data()), bytes.size()};
+    };
+    std::array<iovec, 2> parts = {part(first), part(second)};
+    msghdr message{};
+    message.msg_iov = parts.data();
+    message.msg_iovlen = parts.size();
+    return outcome(::sendmsg(socket.number(), &message, MSG_NOSIGNAL));
+}
+
+} // namespace pallax
