@@ -1,0 +1,18 @@
+#pragma once
+
+#include "cli/ExitStatus.h"
+#include "cli/Options.h"
+
+#include <string_view>
+
+/// What the parsed command line runs: the parts of the system, wired to this machine. Each
+/// reports on standard error; OutputClosed, OutputFailure and FatalRecord leave.
+namespace pallax {
+
+ExitStatus runDecode(const DecodeOptions& options);
+ExitStatus runBrowse(const BrowseOptions& options);
+
+/// "pallax: " and the sentence, on standard error.
+void complain(std::string_view sentence);
+
+} // namespace pallax

@@ -1,0 +1,48 @@
+#include "cli/FatalRecord.h"
+#include "cli/Output.h"
+#include "cli/Programs.h"
+
+#include <csignal>
+#include <cstdio>
+#include <exception>
+#include <string>
+#include <unistd.h>
+#include <vector>
+
+namespace {
+
+using namespace pallax;
+
+struct Run {
+    ExitStatus operator()(const BrowseOptions& options) const { return runBrowse(options); }
+    ExitStatus operator()(const DecodeOptions& options) const { return runDecode(options); }
+    ExitStatus operator()(const ServiceOptions& options) const { return runService(options); }
+    ExitStatus operator()(const ParseEnd& end) const {
+        const bool wanted = end.status == kExitSuccess;
+        Output output(writeToDescriptor(wanted ? STDOUT_FILENO : STDERR_FILENO, "the terminal"));
+        output.text() = end.text;
+        output.flush();
+        return end.status;
+    }
+};
+
+ExitStatus run(std::vector<std::string> arguments) {
+    try {
+        return std::visit(Run(), parseOptions(std::move(arguments)));
+    } catch (const OutputClosed&) {
+        return kExitSuccess; // whoever reads has seen enough
+    } catch (const FatalRecord& fatal) {
+        complain(fatal.what());
+        return kExitFatalRecord;
+    } catch (const std::exception& error) {
+        complain(error.what());
+        return kExitFailure;
+    }
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    (void)std::signal(SIGPIPE, SIG_IGN); // a closed pipe is an error of write
+    return run({argv + (argc > 0 ? 1 : 0), argv + argc});
+}
