@@ -3,9 +3,7 @@
 #include <CLI/CLI.hpp>
 
 #include <algorithm>
-#include <charconv>
-#include <cmath>
-#include <map>
+#include <utility>
 
 namespace pallax {
 
@@ -37,34 +35,20 @@ constexpr const char* kServiceFooter = R"(Examples:
   pallax service --play drive.pcap
   pallax service --play drive.pcap --speed max --loop)";
 
-/// Positive and finite, or "max".
-bool readSpeed(const std::string& text, PlaySpeed& speed) {
-    if (text == "max") {
-        speed = std::nullopt;
-        return true;
-    }
-    double number = 0;
-    const char* const end = text.data() + text.size();
-    const auto result = std::from_chars(text.data(), end, number);
-    if (result.ec != std::errc() || result.ptr != end || !std::isfinite(number) || number <= 0) {
-        return false;
-    }
-    speed = number;
-    return true;
-}
-
-void addSpeed(CLI::App& app, PlaySpeed& speed) {
-    app.add_option_function<std::string>(
-           "--speed",
-           [&speed](const std::string& text) {
-               if (!readSpeed(text, speed)) {
-                   throw CLI::ValidationError("--speed", "\"" + text +
-                                                             "\" is neither a number above 0 "
-                                                             "nor max");
-               }
-           },
-           "Play that many times as fast; max: as fast as possible")
-        ->type_name("X|max");
+void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
+    const auto takeSpeed = [&play](const std::string& text) {
+        const auto speed = parseSpeed(text);
+        if (!speed) {
+            throw CLI::ValidationError("--speed",
+                                       "\"" + text + "\" is neither a number above 0 nor max");
+        }
+        play.speed = *speed;
+    };
+    app.add_option_function<std::string>("--speed", takeSpeed,
+                                         "Play that many times as fast; max: as fast as possible")
+        ->type_name("X|max")
+        ->needs(recording);
+    app.add_flag("--loop", play.loop, "Begin again at the recording's end")->needs(recording);
 }
 
 /// Every choice goes by its name in the map, in the help and in the message about a wrong one.
@@ -89,13 +73,14 @@ void addChoice(CLI::App& app, const std::string& name, Value& value,
 
 void addBrowse(CLI::App& app, BrowseOptions& options) {
     constexpr int kHighestLevel = 7;
-    app.add_option("RECORDING", options.recording,
-                   "A recording (pcap or pcapng; - is standard input) to browse as it is played; "
-                   "without one, the live modem")
-        ->type_name("");
+    CLI::Option* recording =
+        app.add_option(
+               "RECORDING", options.recording,
+               "A recording (pcap or pcapng; - is standard input) to browse as it is played; "
+               "without one, the live modem")
+            ->type_name("");
     app.add_flag("--print", options.print, "Print the tree as text at each display tick");
-    addSpeed(app, options.speed);
-    app.add_flag("--loop", options.loop, "Begin again at the recording's end");
+    addPlay(app, options.play, recording);
     app.add_flag("--keep-going", options.keepGoing,
                  "Drop a record that cannot be read instead of ending with status 70");
     app.add_option("--log-level", options.logLevel,
@@ -128,11 +113,11 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
 }
 
 void addService(CLI::App& app, ServiceOptions& options) {
-    app.add_option("--play", options.recording, "The recording to play to each viewer")
-        ->required()
-        ->type_name("RECORDING");
-    addSpeed(app, options.speed);
-    app.add_flag("--loop", options.loop, "Begin again at the recording's end");
+    CLI::Option* recording =
+        app.add_option("--play", options.recording, "The recording to play to each viewer")
+            ->required()
+            ->type_name("RECORDING");
+    addPlay(app, options.play, recording);
     app.footer(kServiceFooter);
 }
 

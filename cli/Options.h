@@ -2,6 +2,7 @@
 
 #include "cli/DecodeCommand.h"
 #include "cli/ExitStatus.h"
+#include "telephony/Service.h"
 
 #include <optional>
 #include <string>
@@ -10,22 +11,12 @@
 
 namespace pallax {
 
-/// How fast a recording is played: a multiple of its own time, or nothing for as fast as possible.
-using PlaySpeed = std::optional<double>;
-
 struct BrowseOptions {
     std::optional<std::string> recording; ///< without one, the live modem
-    PlaySpeed speed = 1.0;
-    bool loop = false;
+    PlayOptions play;
     bool print = false;
     bool keepGoing = false;
     std::optional<int> logLevel; ///< system-log lines up to it go to standard error
-};
-
-struct ServiceOptions {
-    std::string recording;
-    PlaySpeed speed = 1.0;
-    bool loop = false;
 };
 
 /// The command line asks for no more than a text, or cannot be understood.

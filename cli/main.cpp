@@ -1,6 +1,7 @@
 #include "cli/FatalRecord.h"
 #include "cli/Output.h"
 #include "cli/Programs.h"
+#include "telephony/ChildService.h"
 
 #include <csignal>
 #include <cstdio>
@@ -16,7 +17,9 @@ using namespace pallax;
 struct Run {
     ExitStatus operator()(const BrowseOptions& options) const { return runBrowse(options); }
     ExitStatus operator()(const DecodeOptions& options) const { return runDecode(options); }
-    ExitStatus operator()(const ServiceOptions& options) const { return runService(options); }
+    ExitStatus operator()(const ServiceOptions& options) const {
+        return runService(options) == 0 ? kExitSuccess : kExitFailure;
+    }
     ExitStatus operator()(const ParseEnd& end) const {
         const bool wanted = end.status == kExitSuccess;
         Output output(writeToDescriptor(wanted ? STDOUT_FILENO : STDERR_FILENO, "the terminal"));
@@ -43,6 +46,9 @@ ExitStatus run(std::vector<std::string> arguments) {
 } // namespace
 
 int main(int argc, char** argv) {
+    if (argc > 1 && argv[1] == kChildServiceCommand) {
+        return runChildService(argc, argv);
+    }
     (void)std::signal(SIGPIPE, SIG_IGN); // a closed pipe is an error of write
     return run({argv + (argc > 0 ? 1 : 0), argv + argc});
 }

@@ -26,8 +26,8 @@ ParseEnd ended(std::vector<std::string> arguments) {
 TEST(Options, WithoutArgumentsTheLiveModemIsBrowsed) {
     const auto options = parsed<BrowseOptions>({});
     EXPECT_EQ(options.recording, std::nullopt);
-    EXPECT_EQ(options.speed, PlaySpeed(1.0));
-    EXPECT_FALSE(options.loop);
+    EXPECT_EQ(options.play.speed, 1.0);
+    EXPECT_FALSE(options.play.loop);
     EXPECT_FALSE(options.keepGoing);
     EXPECT_EQ(options.logLevel, std::nullopt);
 }
@@ -37,11 +37,12 @@ TEST(Options, ARecordingIsBrowsed) {
         {"drive.pcap", "--print", "--speed", "2.5", "--loop", "--keep-going", "--log-level", "4"});
     EXPECT_EQ(options.recording, "drive.pcap");
     EXPECT_TRUE(options.print);
-    EXPECT_EQ(options.speed, PlaySpeed(2.5));
-    EXPECT_TRUE(options.loop);
+    EXPECT_EQ(options.play.speed, 2.5);
+    EXPECT_TRUE(options.play.loop);
     EXPECT_TRUE(options.keepGoing);
     EXPECT_EQ(options.logLevel, 4);
-    EXPECT_EQ(parsed<BrowseOptions>({"--speed", "max", "-"}).speed, std::nullopt);
+    EXPECT_EQ(parsed<BrowseOptions>({"--speed", "max", "-"}).play.speed,
+              PlayOptions::kAsFastAsTaken);
     EXPECT_EQ(parsed<BrowseOptions>({"-"}).recording, "-");
 }
 
@@ -80,8 +81,8 @@ TEST(Options, ServicePlaysARecording) {
     const auto options =
         parsed<ServiceOptions>({"service", "--play", "a.pcap", "--speed", "max", "--loop"});
     EXPECT_EQ(options.recording, "a.pcap");
-    EXPECT_EQ(options.speed, std::nullopt);
-    EXPECT_TRUE(options.loop);
+    EXPECT_EQ(options.play.speed, PlayOptions::kAsFastAsTaken);
+    EXPECT_TRUE(options.play.loop);
 }
 
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
@@ -129,6 +130,8 @@ TEST(Options, WrongUsageIsOneClearSentence) {
 TEST(Options, WhatNobodyKnowsIsNamed) {
     EXPECT_NE(wrongUsage({"--colour", "red"}).find("--colour"), std::string::npos);
     EXPECT_NE(wrongUsage({"a.pcap", "b.pcap"}).find("b.pcap"), std::string::npos);
+    EXPECT_EQ(wrongUsage({"--loop"}),
+              "pallax: --loop requires RECORDING (pallax --help tells more)\n");
     EXPECT_NE(wrongUsage({"--log-level", "8"}).find("--log-level"), std::string::npos);
     EXPECT_NE(wrongUsage({"decode", "--technology", "5g", "a"}).find("ifx|gsm|cdma|lte|utran"),
               std::string::npos);

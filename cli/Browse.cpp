@@ -1,0 +1,174 @@
+#include "LogGenerator/Technologies/Technologies.h"
+#include "cli/FatalRecord.h"
+#include "cli/Programs.h"
+#include "cli/ScopedLog.h"
+#include "cli/Settings.h"
+#include "cli/TreePrinter.h"
+#include "host/AsioMainQueue.h"
+#include "host/BuildBundle.h"
+#include "host/DirectoryResources.h"
+#include "host/LogSinks.h"
+#include "host/SocketMessagePorts.h"
+#include "host/SourceClock.h"
+#include "host/WallClock.h"
+#include "monitor/PallaxModel.h"
+#include "platform/StandardOutput.h"
+#include "telephony/ChildService.h"
+#include "telephony/SocketTelephonyService.h"
+
+#include <csignal>
+#include <memory>
+#include <sys/wait.h>
+#include <unistd.h>
+
+namespace pallax {
+
+namespace {
+
+/// How often the connection and the child service are looked at.
+constexpr std::chrono::milliseconds kLookInterval{500};
+
+/// What generators print when they end goes where the tree goes.
+class PrintedNotices final : public StandardOutput {
+public:
+    explicit PrintedNotices(Output& output) : _output(output) {}
+    void printLine(std::string_view line) override {
+        _output.text() += line;
+        _output.text() += '\n';
+    }
+
+private:
+    Output& _output;
+};
+
+/// True once the child has ended; it is left to its owner to reap.
+bool hasEnded(const ChildService& child) {
+    siginfo_t info{};
+    const auto process = static_cast<id_t>(child.processId());
+    return ::waitid(P_PID, process, &info, WEXITED | WNOHANG | WNOWAIT) == 0 && info.si_pid != 0;
+}
+
+/// A model over the message ports of this machine, and the printer that shows it.
+class Browser {
+public:
+    Browser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
+            Output& output)
+        : _child(child),
+          _localPortName(child != nullptr ? child->privateName(PallaxModel::kLocalPortName)
+                                          : std::string(PallaxModel::kLocalPortName)),
+          _clock(_wallClock, _queue), _socketPorts(_queue, std::move(directory), &_clock),
+          _ports(_socketPorts, onFatalRecord),
+          _telephony(_socketPorts, child != nullptr ? child->controlPortName()
+                                                    : std::string(kTelephonyControlPort)),
+          _resources(DirectoryResources::programFolder()), _notices(output),
+          _printer(output, _clock, [this] { return _model.topLevelNodes(); }),
+          _model({_ports,
+                  _telephony,
+                  _queue,
+                  _clock,
+                  {_clock, _resources, _bundle, _notices},
+                  technologies(),
+                  _printer,
+                  _localPortName}) {}
+
+    /// Browses until a signal, or with a child until its recording has ended. False when the
+    /// child ended before.
+    bool run() {
+        _queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [this](int /*signal*/) { _queue.stop(); });
+        if (_child != nullptr) {
+            // The last tick has posted its view update before; that is to come first.
+            _clock.onEnd([this] { _queue.async([this] { _queue.stop(); }); });
+        }
+        _queue.async([this] {
+            _model.startMonitor();
+            _printer.showConnection(_model.isConnected());
+        });
+        const auto looks = _queue.scheduleRepeating(kLookInterval, [this] { look(); });
+        _queue.run();
+        return !_childLost;
+    }
+
+private:
+    void look() {
+        _printer.showConnection(_model.isConnected());
+        if (_child != nullptr && hasEnded(*_child)) {
+            _childLost = true;
+            _queue.stop();
+        }
+    }
+
+    ChildService* _child;
+    std::string _localPortName;
+    bool _childLost = false;
+    AsioMainQueue _queue;
+    WallClock _wallClock;
+    SourceClock _clock;
+    SocketMessagePorts _socketPorts;
+    GuardedMessagePorts _ports;
+    SocketTelephonyService _telephony;
+    DirectoryResources _resources;
+    BuildBundle _bundle;
+    PrintedNotices _notices;
+    TreePrinter _printer;
+    PallaxModel _model;
+};
+
+ExitStatus browse(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child) {
+    Output output(writeToDescriptor(STDOUT_FILENO, "standard output"));
+    bool whole = false;
+    {
+        Browser browser(std::move(directory), onFatalRecord, child, output);
+        whole = browser.run();
+    }
+    output.flush();
+    if (child == nullptr) {
+        return kExitSuccess;
+    }
+    child->stop();
+    const std::string complaints = child->takeComplaints(); // lines that name the program
+    (void)!::write(STDERR_FILENO, complaints.data(), complaints.size());
+    if (!whole) {
+        complain("The service that plays the recording has ended.");
+    }
+    return whole && complaints.empty() ? kExitSuccess : kExitFailure;
+}
+
+ExitStatus browseWithLog(const BrowseOptions& options, OnFatalRecord onFatalRecord) {
+    std::unique_ptr<ChildService> child;
+    if (options.recording) {
+        auto started = ChildService::start({*options.recording, options.play});
+        if (!started) {
+            complain(started.error().sentence);
+            return kExitFailure;
+        }
+        child = std::move(started).value();
+    }
+    auto directory = SocketDirectory::open();
+    if (!directory) {
+        complain(directory.error().sentence);
+        return kExitFailure;
+    }
+    return browse(std::move(directory).value(), onFatalRecord, child.get());
+}
+
+} // namespace
+
+ExitStatus runBrowse(const BrowseOptions& options) {
+    const SettingsResult settings = loadSettings(settingsFiles());
+    if (!settings) {
+        complain(settings.error().sentence);
+        return kExitFailure;
+    }
+    const OnFatalRecord onFatalRecord =
+        options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord;
+    if (options.logLevel) {
+        StderrSink sink;
+        const ScopedLog log(sink, *options.logLevel);
+        return browseWithLog(options, onFatalRecord);
+    }
+    SyslogSink sink("pallax");
+    const ScopedLog log(sink, static_cast<int>(LogPriority::Error));
+    return browseWithLog(options, onFatalRecord);
+}
+
+} // namespace pallax
