@@ -1,0 +1,224 @@
+#include "telephony/ChildService.h"
+
+#include "host/SocketDirectory.h"
+#include "platform/Format.h"
+
+#include <array>
+#include <cerrno>
+#include <charconv>
+#include <chrono>
+#include <csignal>
+#include <cstring>
+#include <fcntl.h>
+#include <sys/prctl.h>
+#include <sys/wait.h>
+#include <thread>
+#include <vector>
+
+namespace pallax {
+
+namespace {
+
+constexpr int kReadyDescriptor = 3;
+constexpr int kExecFailed = 127;
+
+// The child's arguments, after the program's name.
+enum Argument { kCommand = 1, kControlPort, kSpeed, kLoop, kInterval, kRecording, kArgumentCount };
+constexpr std::string_view kLooping = "loop";
+constexpr std::string_view kOnce = "once";
+
+struct Pipe {
+    Descriptor read;
+    Descriptor write;
+};
+
+Pipe makePipe() {
+    std::array<int, 2> ends{};
+    if (::pipe2(ends.data(), O_CLOEXEC) != 0) {
+        return {};
+    }
+    return {Descriptor(ends[0]), Descriptor(ends[1])};
+}
+
+std::string readToEnd(const Descriptor& descriptor) {
+    std::string text;
+    std::array<char, 1024> piece{};
+    for (;;) {
+        const ssize_t count = ::read(descriptor.number(), piece.data(), piece.size());
+        if (count > 0) {
+            text.append(piece.data(), static_cast<std::size_t>(count));
+        } else if (count == 0 || errno != EINTR) {
+            return text;
+        }
+    }
+}
+
+/// True when the child says that it is ready; false when it ends without.
+bool waitUntilReady(const Descriptor& ready) {
+    char sign = 0;
+    ssize_t count = 0;
+    do {
+        count = ::read(ready.number(), &sign, 1);
+    } while (count < 0 && errno == EINTR);
+    return count == 1;
+}
+
+std::vector<std::string> argumentsFor(const ServiceOptions& options) {
+    return {"pallax",
+            std::string(kChildServiceCommand),
+            options.controlPortName,
+            speedText(options.play.speed),
+            std::string(options.play.loop ? kLooping : kOnce),
+            std::to_string(options.play.displayInterval.count()),
+            options.recording};
+}
+
+/// In the child, between fork and exec: only what is safe there, and it does not return.
+[[noreturn]] void becomeService(pid_t parent, char* const* arguments, bool readsInput, int ready,
+                                int complaints) {
+    // Moved out of the way first, for either may be the number that the other is to have.
+    const int readyCopy = ::fcntl(ready, F_DUPFD_CLOEXEC, kReadyDescriptor + 1);
+    const int complaintsCopy = ::fcntl(complaints, F_DUPFD_CLOEXEC, kReadyDescriptor + 1);
+    const int nothing = ::open("/dev/null", O_RDWR | O_CLOEXEC);
+    const bool wired =
+        ::dup2(readyCopy, kReadyDescriptor) >= 0 && ::dup2(complaintsCopy, STDERR_FILENO) >= 0 &&
+        ::dup2(nothing, STDOUT_FILENO) >= 0 && (readsInput || ::dup2(nothing, STDIN_FILENO) >= 0);
+    // Ctrl-C at the terminal goes to its whole group; when the child ends is the viewer's to say.
+    (void)::setpgid(0, 0);
+    if (wired && ::prctl(PR_SET_PDEATHSIG, SIGTERM) == 0 && ::getppid() == parent) {
+        (void)::execv("/proc/self/exe", arguments);
+    }
+    ::_exit(kExecFailed);
+}
+
+/// Ctrl-C at the terminal reaches the whole group; the viewer decides when the child ends.
+void leaveProcessGroup(pid_t process) {
+    (void)::setpgid(process, process);
+}
+
+bool hasEnded(pid_t process) {
+    const pid_t result = ::waitpid(process, nullptr, WNOHANG);
+    return result == process || (result < 0 && errno == ECHILD);
+}
+
+void end(pid_t process) {
+    constexpr std::chrono::milliseconds kPatience{2000};
+    constexpr std::chrono::milliseconds kLook{2};
+    (void)::kill(process, SIGTERM);
+    for (auto waited = kLook; waited < kPatience; waited += kLook) {
+        if (hasEnded(process)) {
+            return;
+        }
+        std::this_thread::sleep_for(kLook);
+    }
+    (void)::kill(process, SIGKILL);
+    (void)::waitpid(process, nullptr, 0);
+}
+
+/// Without the newline, and without the program's name before it.
+std::string sentenceOf(std::string complaint) {
+    constexpr std::string_view kName = "pallax: ";
+    if (complaint.starts_with(kName)) {
+        complaint.erase(0, kName.size());
+    }
+    while (complaint.ends_with('\n')) {
+        complaint.pop_back();
+    }
+    return complaint.empty() ? "The telephony service did not start." : complaint;
+}
+
+std::string uniqueSuffix() {
+    static int count = 0; // of the services that this process has started
+    return formatText(".%d.%d", {::getpid(), ++count});
+}
+
+} // namespace
+
+Result<std::unique_ptr<ChildService>, HostError> ChildService::start(ServiceOptions options) {
+    const auto directory = SocketDirectory::open();
+    if (!directory) {
+        return directory.error();
+    }
+    directory->removeStaleSockets();
+    const std::string suffix = uniqueSuffix();
+    options.controlPortName = std::string(kTelephonyControlPort) + suffix;
+    std::vector<std::string> arguments = argumentsFor(options);
+    std::vector<char*> pointers;
+    for (std::string& argument : arguments) {
+        pointers.push_back(argument.data());
+    }
+    pointers.push_back(nullptr);
+    Pipe ready = makePipe();
+    Pipe complaints = makePipe();
+    const pid_t parent = ::getpid();
+    const pid_t process = ready.read && complaints.read ? ::fork() : -1;
+    if (process == 0) {
+        becomeService(parent, pointers.data(), options.recording == "-", ready.write.number(),
+                      complaints.write.number());
+    }
+    if (process < 0) {
+        return HostError{
+            formatText("The telephony service cannot be started: %@.", {std::strerror(errno)})};
+    }
+    ready.write.reset();
+    complaints.write.reset();
+    std::unique_ptr<ChildService> service(
+        new ChildService(suffix, process, std::move(complaints.read)));
+    if (waitUntilReady(ready.read)) {
+        return service;
+    }
+    return HostError{sentenceOf(readToEnd(service->_complaints))};
+}
+
+ChildService::ChildService(std::string suffix, pid_t process, Descriptor complaints)
+    : _suffix(std::move(suffix)), _controlPortName(std::string(kTelephonyControlPort) + _suffix),
+      _process(process), _complaints(std::move(complaints)) {}
+
+ChildService::~ChildService() {
+    stop();
+}
+
+std::string ChildService::privateName(std::string_view base) const {
+    return std::string(base) + _suffix;
+}
+
+void ChildService::stop() {
+    if (_process == 0) {
+        return;
+    }
+    end(std::exchange(_process, 0));
+    if (const auto directory = SocketDirectory::open()) {
+        directory->removeStaleSockets();
+    }
+}
+
+std::string ChildService::takeComplaints() {
+    const int flags = ::fcntl(_complaints.number(), F_GETFL);
+    (void)::fcntl(_complaints.number(), F_SETFL, flags | O_NONBLOCK);
+    return readToEnd(_complaints);
+}
+
+int runChildService(int argc, char** argv) {
+    if (argc != kArgumentCount) {
+        return 2;
+    }
+    const std::vector<std::string> arguments(argv, argv + argc);
+    ServiceOptions options;
+    options.controlPortName = arguments[kControlPort];
+    options.play.speed = parseSpeed(arguments[kSpeed]).value_or(1.0);
+    options.play.loop = arguments[kLoop] == kLooping;
+    options.recording = arguments[kRecording];
+    std::int64_t interval = 0;
+    const std::string& text = arguments[kInterval];
+    (void)std::from_chars(text.data(), text.data() + text.size(), interval);
+    if (interval > 0) {
+        options.play.displayInterval = std::chrono::nanoseconds(interval);
+    }
+    return runService(options, [] {
+        const Descriptor ready(kReadyDescriptor);
+        (void)::fcntl(ready.number(), F_SETFD, FD_CLOEXEC);
+        (void)!::write(ready.number(), "+", 1);
+    });
+}
+
+} // namespace pallax

@@ -1,0 +1,24 @@
+#pragma once
+
+#include "host/PortFrame.h"
+
+#include <cstddef>
+#include <functional>
+
+namespace pallax {
+
+/// Where a player's frames go: the receiving end of a log channel.
+class PacketSink {
+public:
+    virtual ~PacketSink() = default;
+    /// Appends a frame to the present chunk.
+    virtual void write(const FrameHeader& header, Bytes data) = 0;
+    /// Bytes in the present chunk.
+    virtual std::size_t pending() const = 0;
+    /// Sends the chunk and then calls `done`, as a block of the main queue: as late as the
+    /// receiver makes it. Nothing is written meanwhile. After the receiver has gone `done` is
+    /// not called.
+    virtual void flush(std::function<void()> done) = 0;
+};
+
+} // namespace pallax

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "telephony/PacketPlayer.h"
+#include "telephony/PacketSource.h"
+#include "telephony/SocketSink.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace pallax {
+
+class LocalMessagePort;
+class SocketMessagePorts;
+
+/// One log channel of the service: answers GetTechnology on its port, and streams to its client
+/// from the start command on. It lasts until the client ends the connection that it feeds.
+class ServedChannel {
+public:
+    struct Setup {
+        AsioMainQueue& queue;
+        SocketMessagePorts& ports;
+        std::string portName;         ///< of the channel's own port
+        std::string receiverPortName; ///< of the client's local port
+        std::unique_ptr<PacketSource> source;
+        PlayOptions options;
+        /// The client has gone; may destroy the channel.
+        std::function<void()> closed;
+        /// The source has come to its end, with its failure or an empty text.
+        std::function<void(const std::string& failure)> ended;
+    };
+
+    /// Zero, or the errno that says why there is no channel (then `channel` stays empty).
+    static int open(Setup setup, std::unique_ptr<ServedChannel>& channel);
+    ~ServedChannel();
+    ServedChannel(const ServedChannel&) = delete;
+    ServedChannel& operator=(const ServedChannel&) = delete;
+
+private:
+    ServedChannel(std::unique_ptr<PacketSource> source, std::unique_ptr<SocketSink> sink);
+    std::optional<ByteBuffer> answer(Bytes request);
+
+    std::unique_ptr<PacketSource> _source;
+    std::unique_ptr<SocketSink> _sink;
+    std::unique_ptr<PacketPlayer> _player;
+    std::unique_ptr<LocalMessagePort> _port;
+};
+
+} // namespace pallax

@@ -1,0 +1,75 @@
+#include "telephony/TelephonyServer.h"
+
+#include "host/AsioMainQueue.h"
+#include "host/SocketMessagePorts.h"
+#include "platform/Format.h"
+#include "telephony/ServedChannel.h"
+
+#include <cerrno>
+
+namespace pallax {
+
+Result<std::unique_ptr<TelephonyServer>, HostError> TelephonyServer::start(Setup setup) {
+    std::unique_ptr<TelephonyServer> server(new TelephonyServer(std::move(setup)));
+    const Setup& kept = server->_setup;
+    auto local = kept.ports.createLocal(
+        kept.controlPortName, [self = server.get()](std::int32_t /*identifier*/, Bytes data) {
+            return self->answer(data);
+        });
+    if (local.port == nullptr) {
+        return HostError{kept.ports.lastError()};
+    }
+    if (local.alreadyExisted) {
+        return HostError{
+            formatText("A telephony service named %@ is already running.", {kept.controlPortName})};
+    }
+    local.port->setDispatchQueue(kept.queue);
+    server->_control = std::move(local.port);
+    return server;
+}
+
+TelephonyServer::TelephonyServer(Setup setup) : _setup(std::move(setup)) {}
+
+TelephonyServer::~TelephonyServer() = default;
+
+std::optional<ByteBuffer> TelephonyServer::answer(Bytes request) {
+    const auto message = decodeMessage(request);
+    const auto localPort = message ? stringIn(*message, "CreateLogChannel") : std::nullopt;
+    const LogChannel channel =
+        localPort ? createLogChannel(*localPort) : LogChannel{kServiceErrorDomain, EINVAL, {}};
+    return encodeMessage(createLogChannelReply(channel));
+}
+
+LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
+    auto source = _setup.makeSource();
+    if (!source) {
+        report(source.error().sentence);
+        return {kServiceErrorDomain, EIO, {}};
+    }
+    const int number = ++_latestNumber;
+    std::string portName = formatText("%@.LogChannel.%d", {_setup.controlPortName, number});
+    std::unique_ptr<ServedChannel> channel;
+    const int error = ServedChannel::open(
+        ServedChannel::Setup{_setup.queue, _setup.ports, portName, localPortName,
+                             std::move(source).value(), _setup.options,
+                             [this, number] { _channels.erase(number); },
+                             [this](const std::string& failure) {
+                                 if (!failure.empty()) {
+                                     report(failure);
+                                 }
+                             }},
+        channel);
+    if (error != 0) {
+        return {kServiceErrorDomain, error, {}};
+    }
+    _channels.emplace(number, std::move(channel));
+    return {0, 0, std::move(portName)};
+}
+
+void TelephonyServer::report(const std::string& sentence) const {
+    if (_setup.report) {
+        _setup.report(sentence);
+    }
+}
+
+} // namespace pallax
