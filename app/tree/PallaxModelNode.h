@@ -33,7 +33,8 @@ public:
     virtual const PropertyList* value() const { return nullptr; }
 
     /// Builds the tree of a display object; its root is named "Pallax" and has the path "/".
-    /// Fills `pathDictionary` (empty before) with every node.
+    /// Fills `pathDictionary` (empty before) with every node; of two nodes with one path it keeps
+    /// the later. A null object has no tree: null is returned and nothing is stored.
     static NodeRef makeTreeFromObject(const PropertyList& object, PathDictionary& pathDictionary);
 
 private:
@@ -62,7 +63,8 @@ private:
     std::vector<NodeRef> _childNodes;
 };
 
-/// The path of the child `name` below `parent`: "/" + "A" is "/A", "/A" + "B" is "/A/B".
+/// The path of the child `name` below `parent`, joined by exactly one slash: "/" + "A" is "/A",
+/// "/A" + "B" and "/A" + "/B" are "/A/B".
 std::string childPath(std::string_view parent, std::string_view name);
 
 } // namespace pallax

@@ -2,6 +2,7 @@
 
 #include "platform/SystemLog.h"
 
+#include <ostream>
 #include <string>
 #include <string_view>
 #include <utility>

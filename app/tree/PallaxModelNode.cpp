@@ -1,0 +1,127 @@
+#include "app/tree/PallaxModelNode.h"
+
+#include "LogGenerator/Records/ArrayLock.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kTitle = "Pallax";
+constexpr std::string_view kUnknown = "(unknown)";
+/// Asks for a dictionary's entries in sorted order; never shown.
+constexpr std::string_view kSortedKey = "_sorted";
+constexpr char kSortSeparator = ';';
+
+/// The array lock, held for a scope.
+class HeldArrayLock {
+public:
+    HeldArrayLock() { ArrayLock::lockArray(); }
+    ~HeldArrayLock() { ArrayLock::unlockArray(); }
+    HeldArrayLock(const HeldArrayLock&) = delete;
+    HeldArrayLock& operator=(const HeldArrayLock&) = delete;
+};
+
+/// What a sorted dictionary shows of a key: the second of exactly two pieces, else the whole.
+std::string_view nameOfSortedKey(std::string_view key) {
+    const std::size_t separator = key.find(kSortSeparator);
+    if (separator == std::string_view::npos ||
+        key.find(kSortSeparator, separator + 1) != std::string_view::npos) {
+        return key;
+    }
+    return key.substr(separator + 1);
+}
+
+class TreeBuilder {
+public:
+    explicit TreeBuilder(PathDictionary& paths) : _paths(paths) {}
+
+    /// Null for a null object: where there is no value there is no row.
+    NodeRef node(std::string_view name, const PropertyList& object, const std::string& path) {
+        if (object.isNull()) {
+            return nullptr;
+        }
+        NodeRef made = make(std::string(name), object, path);
+        _paths.insert_or_assign(path, made);
+        return made;
+    }
+
+private:
+    NodeRef make(std::string name, const PropertyList& object, const std::string& path) {
+        if (object.isString()) {
+            return std::make_shared<PallaxModelLeafNode>(std::move(name), object);
+        }
+        if (const DictionaryRef dictionary = object.dictionary()) {
+            return std::make_shared<PallaxModelTreeNode>(std::move(name),
+                                                         childrenOf(*dictionary, path));
+        }
+        if (const ArrayRef array = object.array()) {
+            return std::make_shared<PallaxModelTreeNode>(std::move(name), childrenOf(*array, path));
+        }
+        return std::make_shared<PallaxModelLeafNode>(std::move(name), Text::fixed(kUnknown));
+    }
+
+    std::vector<NodeRef> childrenOf(const Dictionary& dictionary, const std::string& path) {
+        const PropertyList* mark = dictionary.find(kSortedKey);
+        const bool sorted = mark != nullptr && !mark->isNull();
+        std::vector<const Dictionary::Entry*> shown;
+        shown.reserve(dictionary.size());
+        for (const Dictionary::Entry& entry : dictionary) {
+            if (entry.hasStringKey && entry.key.view() != kSortedKey) {
+                shown.push_back(&entry);
+            }
+        }
+        if (sorted) {
+            std::sort(shown.begin(), shown.end(),
+                      [](const auto* a, const auto* b) { return a->key.view() < b->key.view(); });
+        }
+        std::vector<NodeRef> children;
+        children.reserve(shown.size());
+        for (const Dictionary::Entry* entry : shown) {
+            const std::string_view key = entry->key.view();
+            append(children, sorted ? nameOfSortedKey(key) : key, entry->value, path);
+        }
+        return children;
+    }
+
+    std::vector<NodeRef> childrenOf(const Array& array, const std::string& path) {
+        const HeldArrayLock lock; // records may be replacing the elements
+        std::vector<NodeRef> children;
+        children.reserve(array.size());
+        for (const PropertyList& element : array) {
+            append(children, std::to_string(children.size()), element, path);
+        }
+        return children;
+    }
+
+    void append(std::vector<NodeRef>& children, std::string_view name, const PropertyList& object,
+                const std::string& parentPath) {
+        if (NodeRef child = node(name, object, childPath(parentPath, name))) {
+            children.push_back(std::move(child));
+        }
+    }
+
+    PathDictionary& _paths;
+};
+
+} // namespace
+
+NodeRef PallaxModelNode::makeTreeFromObject(const PropertyList& object,
+                                            PathDictionary& pathDictionary) {
+    return TreeBuilder(pathDictionary).node(kTitle, object, "/");
+}
+
+std::string childPath(std::string_view parent, std::string_view name) {
+    const std::size_t parentEnd = parent.find_last_not_of('/') + 1; // 0 where there is none
+    const std::size_t nameStart = std::min(name.find_first_not_of('/'), name.size());
+    std::string path;
+    path.reserve(parentEnd + 1 + name.size() - nameStart);
+    path += parent.substr(0, parentEnd);
+    path += '/';
+    path += name.substr(nameStart);
+    return path;
+}
+
+} // namespace pallax

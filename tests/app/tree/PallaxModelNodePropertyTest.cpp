@@ -1,0 +1,130 @@
+#include "app/tree/PallaxModelNode.h"
+
+#include <gtest/gtest.h>
+#include <rapidcheck.h>
+
+#include <unordered_set>
+
+namespace pallax {
+namespace {
+
+constexpr int kDeepest = 4;
+constexpr int kWidest = 6;
+
+/// A display object of strings, dictionaries and arrays; every dictionary is sorted or not, and
+/// names hold separators, slashes and repetitions.
+PropertyList randomObject(int depth) {
+    const int kind = *rc::gen::inRange(0, depth > 0 ? 3 : 1);
+    if (kind == 0) {
+        return *rc::gen::arbitrary<std::string>();
+    }
+    const int count = *rc::gen::inRange(0, kWidest);
+    if (kind == 1) {
+        Array array;
+        for (int at = 0; at < count; ++at) {
+            array.push_back(randomObject(depth - 1));
+        }
+        return array;
+    }
+    Dictionary dictionary;
+    if (*rc::gen::arbitrary<bool>()) {
+        dictionary.set("_sorted", "1");
+    }
+    for (int at = 0; at < count; ++at) {
+        const auto key =
+            *rc::gen::container<std::string>(rc::gen::element('a', 'B', '1', ';', '/'));
+        dictionary.set(key, randomObject(depth - 1));
+    }
+    return dictionary;
+}
+
+struct Count {
+    int leaves = 0;
+    int branches = 0;
+    friend bool operator==(const Count&, const Count&) = default;
+};
+
+/// What the object holds, its reserved keys left out.
+void count(const PropertyList& object, Count& total) {
+    if (const auto dictionary = object.dictionary()) {
+        ++total.branches;
+        for (const auto& entry : *dictionary) {
+            if (entry.key.view() != "_sorted") {
+                count(entry.value, total);
+            }
+        }
+    } else if (const auto array = object.array()) {
+        ++total.branches;
+        for (const PropertyList& element : *array) {
+            count(element, total);
+        }
+    } else {
+        ++total.leaves;
+    }
+}
+
+/// Walks a tree with the path of every node, children before their parent, as it was built.
+template <class Visit>
+void walk(const NodeRef& node, const std::string& path, const Visit& visit) {
+    if (const auto* children = node->childNodes()) {
+        for (const NodeRef& child : *children) {
+            walk(child, childPath(path, child->displayName()), visit);
+        }
+    }
+    visit(node, path);
+}
+
+TEST(PallaxModelNodeProperty, EveryPathLeadsToTheLastNodeThatStandsThere) {
+    EXPECT_TRUE(rc::check([] {
+        PathDictionary paths;
+        const NodeRef root = PallaxModelNode::makeTreeFromObject(randomObject(kDeepest), paths);
+        PathDictionary expected;
+        walk(root, "/", [&](const NodeRef& node, const std::string& path) {
+            expected.insert_or_assign(path, node);
+        });
+        RC_ASSERT(paths == expected);
+        RC_ASSERT(paths.at("/") == root);
+    }));
+}
+
+TEST(PallaxModelNodeProperty, EveryValueHasExactlyOneNodeOfItsKind) {
+    EXPECT_TRUE(rc::check([] {
+        const PropertyList object = randomObject(kDeepest);
+        PathDictionary paths;
+        const NodeRef root = PallaxModelNode::makeTreeFromObject(object, paths);
+        Count expected;
+        count(object, expected);
+        Count found;
+        std::unordered_set<const PallaxModelNode*> seen;
+        walk(root, "/", [&](const NodeRef& node, const std::string& path) {
+            ++(node->childNodes() != nullptr ? found.branches : found.leaves);
+            RC_ASSERT((node->childNodes() == nullptr) == (node->value() != nullptr));
+            RC_ASSERT(seen.insert(node.get()).second);
+            RC_ASSERT(path.front() == '/');
+        });
+        RC_ASSERT(found == expected);
+    }));
+}
+
+TEST(PallaxModelNodeProperty, SortedRowsAreInAscendingOrderOfTheirKeys) {
+    EXPECT_TRUE(rc::check([](const std::vector<std::string>& keys) {
+        Dictionary object{{"_sorted", "1"}};
+        for (const std::string& key : keys) {
+            object.set(key, key); // the value remembers the key
+        }
+        object.set("_sorted", "1");
+        PathDictionary paths;
+        const NodeRef root = PallaxModelNode::makeTreeFromObject(object, paths);
+        std::string previous;
+        for (const NodeRef& child : *root->childNodes()) {
+            const std::string key = child->value()->string().value();
+            RC_ASSERT(previous <= key);
+            RC_ASSERT(key.ends_with(child->displayName()));
+            previous = key;
+        }
+        RC_ASSERT(root->childNodes()->size() == object.size() - 1);
+    }));
+}
+
+} // namespace
+} // namespace pallax

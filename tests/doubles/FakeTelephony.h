@@ -1,0 +1,63 @@
+#pragma once
+
+#include "platform/TelephonyService.h"
+
+#include <utility>
+#include <vector>
+
+namespace pallax::doubles {
+
+/// A telephony service that answers as its public fields say and keeps a diary.
+class FakeTelephony final : public TelephonyService {
+public:
+    bool reachable = true;
+    LogChannel channel{0, 0, "modem"};   ///< what every request for a log channel gives
+    std::function<void()> duringChannel; ///< called while a log channel is being created
+    std::vector<std::string> diary;      ///< "connect", "channel LOCALPORT", "release"
+
+    std::unique_ptr<HXServerConnection> connect(std::function<void()> notification) override {
+        diary.emplace_back("connect");
+        if (!reachable) {
+            return nullptr;
+        }
+        _notification = std::move(notification);
+        return std::make_unique<Connection>(*this);
+    }
+
+    /// Notifies the living connection; false when there is none.
+    bool notify() const {
+        if (!_notification) {
+            return false;
+        }
+        _notification();
+        return true;
+    }
+
+private:
+    class Connection final : public HXServerConnection {
+    public:
+        explicit Connection(FakeTelephony& service) : _service(service) {}
+        ~Connection() override {
+            _service.diary.emplace_back("release");
+            _service._notification = nullptr;
+        }
+        Connection(const Connection&) = delete;
+        Connection& operator=(const Connection&) = delete;
+
+        LogChannel
+        HXServerConnectionNetworkMonitorCreateLogChannel(std::string_view localPortName) override {
+            _service.diary.push_back("channel " + std::string(localPortName));
+            if (_service.duringChannel) {
+                _service.duringChannel();
+            }
+            return _service.channel;
+        }
+
+    private:
+        FakeTelephony& _service;
+    };
+
+    std::function<void()> _notification;
+};
+
+} // namespace pallax::doubles
