@@ -1,0 +1,31 @@
+#pragma once
+
+#include "platform/Bytes.h"
+#include "platform/Date.h"
+
+#include <string_view>
+#include <vector>
+
+namespace pallax {
+
+/// One packet of a sample recording, transport prefix included.
+struct SamplePacket {
+    Time time;
+    ByteBuffer data;
+};
+
+/// A recording that the repository carries; the same on every machine and at every run.
+struct Sample {
+    std::string_view fileName;   ///< "gsm-attach.pcap"
+    std::string_view technology; ///< as the command line names it
+    std::vector<SamplePacket> (*packets)();
+};
+
+/// When every sample begins: 2023-11-14 22:13:20 UTC.
+inline constexpr Time kSampleStart{std::chrono::seconds{1700000000}};
+
+/// Half a minute of a GSM phone: power-on, search, location update, attach, idle, one rejected
+/// update, detach.
+std::vector<SamplePacket> gsmAttachPackets();
+
+} // namespace pallax

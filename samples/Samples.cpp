@@ -1,0 +1,32 @@
+#include "samples/Samples.h"
+
+#include "host/Recording.h"
+#include "host/RecordingWriter.h"
+
+#include <array>
+
+namespace pallax {
+
+std::span<const Sample> samples() {
+    static constexpr auto kSamples = std::to_array<Sample>({
+        {"gsm-attach.pcap", "gsm", gsmAttachPackets},
+    });
+    return kSamples;
+}
+
+std::optional<std::string> writeSample(const Sample& sample, const std::string& path) {
+    const RecordedTechnology* technology = technologyOfCommandName(sample.technology);
+    auto created = RecordingWriter::create(path, technology->linkType);
+    if (!created) {
+        return created.error().sentence;
+    }
+    const std::unique_ptr<RecordingWriter> writer = std::move(created).value();
+    for (const SamplePacket& packet : sample.packets()) {
+        if (const auto error = writer->write(packet.time, packet.data)) {
+            return error->sentence;
+        }
+    }
+    return std::nullopt;
+}
+
+} // namespace pallax

@@ -1,0 +1,17 @@
+#pragma once
+
+#include "samples/Sample.h"
+
+#include <optional>
+#include <span>
+#include <string>
+
+namespace pallax {
+
+/// Every sample recording of the repository.
+std::span<const Sample> samples();
+
+/// Writes the sample to `path`; the sentence that tells why not, if it could not.
+std::optional<std::string> writeSample(const Sample& sample, const std::string& path);
+
+} // namespace pallax
