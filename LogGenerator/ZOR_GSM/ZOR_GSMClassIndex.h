@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/ClassIndex.h"
+#include "LogGenerator/ZOR_GSM/ActiveSet.h"
 #include "LogGenerator/ZOR_GSM/CellChangeCounters.h"
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
 #include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
@@ -22,6 +23,7 @@ public:
     ~ZOR_GSMClassIndex() override;
 
 private:
+    std::unique_ptr<ActiveSet> objActiveSet = create<ActiveSet>();
     std::unique_ptr<CodingScheme> objCodingScheme = create<CodingScheme>();
     std::unique_ptr<ProcessPS> objProcessPS = create<ProcessPS>();
     std::unique_ptr<UMTSRRMeasurement> objUMTSRRMeasurement = create<UMTSRRMeasurement>();
