@@ -4,6 +4,7 @@
 #include "LogGenerator/ZOR_GSM/ActiveSet.h"
 #include "LogGenerator/ZOR_GSM/CellChangeCounters.h"
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
+#include "LogGenerator/ZOR_GSM/DetectedSet.h"
 #include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
 #include "LogGenerator/ZOR_GSM/NonRankedUMTSSet.h"
 #include "LogGenerator/ZOR_GSM/ProcessCO.h"
@@ -29,6 +30,7 @@ private:
     std::unique_ptr<UMTSRRMeasurement> objUMTSRRMeasurement = create<UMTSRRMeasurement>();
     // The field is singular, its class is not.
     std::unique_ptr<CellChangeCounters> objCellChangeCounter = create<CellChangeCounters>();
+    std::unique_ptr<DetectedSet> objDetectedSet = create<DetectedSet>();
     std::unique_ptr<NonRankedGSMSet> objNonRankedGSMSet = create<NonRankedGSMSet>();
     std::unique_ptr<ProcessCO> objProcessCO = create<ProcessCO>();
     std::unique_ptr<NonRankedUMTSSet> objNonRankedUMTSSet = create<NonRankedUMTSSet>();
