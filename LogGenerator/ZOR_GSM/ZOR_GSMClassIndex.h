@@ -12,6 +12,7 @@
 #include "LogGenerator/ZOR_GSM/ProcessCS.h"
 #include "LogGenerator/ZOR_GSM/ProcessPS.h"
 #include "LogGenerator/ZOR_GSM/UMTSRRMeasurement.h"
+#include "LogGenerator/ZOR_GSM/VirtualActiveSet.h"
 
 #include <memory>
 
@@ -37,6 +38,7 @@ private:
     std::unique_ptr<MonitoredSet> objMonitoredSet = create<MonitoredSet>();
     std::unique_ptr<NonRankedUMTSSet> objNonRankedUMTSSet = create<NonRankedUMTSSet>();
     std::unique_ptr<ProcessCS> objProcessCS = create<ProcessCS>();
+    std::unique_ptr<VirtualActiveSet> objVirtualActiveSet = create<VirtualActiveSet>();
 };
 
 } // namespace pallax
