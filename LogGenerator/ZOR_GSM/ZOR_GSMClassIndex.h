@@ -5,6 +5,7 @@
 #include "LogGenerator/ZOR_GSM/CellChangeCounters.h"
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
 #include "LogGenerator/ZOR_GSM/DetectedSet.h"
+#include "LogGenerator/ZOR_GSM/GSMSet.h"
 #include "LogGenerator/ZOR_GSM/MonitoredSet.h"
 #include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
 #include "LogGenerator/ZOR_GSM/NonRankedUMTSSet.h"
@@ -33,6 +34,7 @@ private:
     // The field is singular, its class is not.
     std::unique_ptr<CellChangeCounters> objCellChangeCounter = create<CellChangeCounters>();
     std::unique_ptr<DetectedSet> objDetectedSet = create<DetectedSet>();
+    std::unique_ptr<GSMSet> objGSMSet = create<GSMSet>();
     std::unique_ptr<NonRankedGSMSet> objNonRankedGSMSet = create<NonRankedGSMSet>();
     std::unique_ptr<ProcessCO> objProcessCO = create<ProcessCO>();
     std::unique_ptr<MonitoredSet> objMonitoredSet = create<MonitoredSet>();
