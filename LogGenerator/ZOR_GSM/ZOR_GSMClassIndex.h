@@ -13,6 +13,7 @@
 #include "LogGenerator/ZOR_GSM/ProcessCS.h"
 #include "LogGenerator/ZOR_GSM/ProcessPS.h"
 #include "LogGenerator/ZOR_GSM/UMTSRRMeasurement.h"
+#include "LogGenerator/ZOR_GSM/UMTSSet.h"
 #include "LogGenerator/ZOR_GSM/VirtualActiveSet.h"
 
 #include <memory>
@@ -37,6 +38,7 @@ private:
     std::unique_ptr<GSMSet> objGSMSet = create<GSMSet>();
     std::unique_ptr<NonRankedGSMSet> objNonRankedGSMSet = create<NonRankedGSMSet>();
     std::unique_ptr<ProcessCO> objProcessCO = create<ProcessCO>();
+    std::unique_ptr<UMTSSet> objUMTSSet = create<UMTSSet>();
     std::unique_ptr<MonitoredSet> objMonitoredSet = create<MonitoredSet>();
     std::unique_ptr<NonRankedUMTSSet> objNonRankedUMTSSet = create<NonRankedUMTSSet>();
     std::unique_ptr<ProcessCS> objProcessCS = create<ProcessCS>();
