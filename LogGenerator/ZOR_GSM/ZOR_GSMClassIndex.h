@@ -12,6 +12,7 @@
 #include "LogGenerator/ZOR_GSM/ProcessCO.h"
 #include "LogGenerator/ZOR_GSM/ProcessCS.h"
 #include "LogGenerator/ZOR_GSM/ProcessPS.h"
+#include "LogGenerator/ZOR_GSM/UMTSRRInfo.h"
 #include "LogGenerator/ZOR_GSM/UMTSRRMeasurement.h"
 #include "LogGenerator/ZOR_GSM/UMTSSet.h"
 #include "LogGenerator/ZOR_GSM/VirtualActiveSet.h"
@@ -42,6 +43,7 @@ private:
     std::unique_ptr<MonitoredSet> objMonitoredSet = create<MonitoredSet>();
     std::unique_ptr<NonRankedUMTSSet> objNonRankedUMTSSet = create<NonRankedUMTSSet>();
     std::unique_ptr<ProcessCS> objProcessCS = create<ProcessCS>();
+    std::unique_ptr<UMTSRRInfo> objUMTSRRInfo = create<UMTSRRInfo>();
     std::unique_ptr<VirtualActiveSet> objVirtualActiveSet = create<VirtualActiveSet>();
 };
 
