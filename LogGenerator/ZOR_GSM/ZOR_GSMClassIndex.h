@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Records/ClassIndex.h"
 #include "LogGenerator/ZOR_GSM/ActiveSet.h"
+#include "LogGenerator/ZOR_GSM/BLER.h"
 #include "LogGenerator/ZOR_GSM/CellChangeCounters.h"
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
 #include "LogGenerator/ZOR_GSM/DetectedSet.h"
@@ -44,6 +45,7 @@ private:
     std::unique_ptr<NonRankedUMTSSet> objNonRankedUMTSSet = create<NonRankedUMTSSet>();
     std::unique_ptr<ProcessCS> objProcessCS = create<ProcessCS>();
     std::unique_ptr<UMTSRRInfo> objUMTSRRInfo = create<UMTSRRInfo>();
+    std::unique_ptr<BLER> objBLER = create<BLER>();
     std::unique_ptr<VirtualActiveSet> objVirtualActiveSet = create<VirtualActiveSet>();
 };
 
