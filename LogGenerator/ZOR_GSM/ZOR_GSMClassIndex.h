@@ -7,6 +7,7 @@
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
 #include "LogGenerator/ZOR_GSM/DetectedSet.h"
 #include "LogGenerator/ZOR_GSM/GSMSet.h"
+#include "LogGenerator/ZOR_GSM/HSDPAInformation.h"
 #include "LogGenerator/ZOR_GSM/MonitoredSet.h"
 #include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
 #include "LogGenerator/ZOR_GSM/NonRankedUMTSSet.h"
@@ -47,6 +48,7 @@ private:
     std::unique_ptr<UMTSRRInfo> objUMTSRRInfo = create<UMTSRRInfo>();
     std::unique_ptr<BLER> objBLER = create<BLER>();
     std::unique_ptr<VirtualActiveSet> objVirtualActiveSet = create<VirtualActiveSet>();
+    std::unique_ptr<HSDPAInformation> objHSDPAInformation = create<HSDPAInformation>();
 };
 
 } // namespace pallax
