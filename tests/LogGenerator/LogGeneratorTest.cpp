@@ -1,7 +1,6 @@
 #include "LogGenerator/LogGenerator.h"
 
 #include "LogGenerator/Records/Exceptions.h"
-
 #include "tests/doubles/FakeGenerator.h"
 #include "tests/doubles/GeneratorFixture.h"
 #include "tests/doubles/RecordingLog.h"

@@ -6,6 +6,7 @@
 #include "tests/doubles/FakeGenerator.h"
 #include "tests/doubles/FakePorts.h"
 #include "tests/doubles/FakeResources.h"
+#include "tests/doubles/FakeStandardOutput.h"
 #include "tests/doubles/FakeTelephony.h"
 #include "tests/doubles/ManualClock.h"
 #include "tests/doubles/RecordingLog.h"
@@ -95,6 +96,7 @@ protected:
     ManualClock clock;
     FakeResources resources;
     FakeBundle bundle;
+    FakeStandardOutput standardOutput;
     FakePorts ports;
     FakeTelephony telephony;
     SteppedQueue queue;
@@ -107,7 +109,7 @@ protected:
                               .telephony = telephony,
                               .queue = queue,
                               .timers = queue,
-                              .generators = {clock, resources, bundle},
+                              .generators = {clock, resources, bundle, standardOutput},
                               .technologies = kFakeTechnologies,
                               .observer = observer});
 };
