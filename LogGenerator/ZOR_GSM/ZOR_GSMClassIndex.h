@@ -1,5 +1,7 @@
 #pragma once
 
+#include "LogGenerator/Common/PDPContextList.h"
+#include "LogGenerator/Common/SimInfo.h"
 #include "LogGenerator/Records/ClassIndex.h"
 #include "LogGenerator/ZOR_GSM/CellChangeCounters.h"
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
@@ -23,6 +25,7 @@ public:
 
 private:
     std::unique_ptr<CodingScheme> objCodingScheme = create<CodingScheme>();
+    std::unique_ptr<PDPContextList> objPDPContextList = create<PDPContextList>();
     std::unique_ptr<ProcessPS> objProcessPS = create<ProcessPS>();
     std::unique_ptr<UMTSRRMeasurement> objUMTSRRMeasurement = create<UMTSRRMeasurement>();
     // The field is singular, its class is not.
@@ -31,6 +34,7 @@ private:
     std::unique_ptr<ProcessCO> objProcessCO = create<ProcessCO>();
     std::unique_ptr<NonRankedUMTSSet> objNonRankedUMTSSet = create<NonRankedUMTSSet>();
     std::unique_ptr<ProcessCS> objProcessCS = create<ProcessCS>();
+    std::unique_ptr<SimInfo> objSimInfo = create<SimInfo>();
 };
 
 } // namespace pallax
