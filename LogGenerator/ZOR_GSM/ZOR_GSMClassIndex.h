@@ -10,6 +10,7 @@
 #include "LogGenerator/ZOR_GSM/ProcessCO.h"
 #include "LogGenerator/ZOR_GSM/ProcessCS.h"
 #include "LogGenerator/ZOR_GSM/ProcessPS.h"
+#include "LogGenerator/ZOR_GSM/ServingPLMN.h"
 #include "LogGenerator/ZOR_GSM/UMTSRRMeasurement.h"
 
 #include <memory>
@@ -32,6 +33,7 @@ private:
     std::unique_ptr<CellChangeCounters> objCellChangeCounter = create<CellChangeCounters>();
     std::unique_ptr<NonRankedGSMSet> objNonRankedGSMSet = create<NonRankedGSMSet>();
     std::unique_ptr<ProcessCO> objProcessCO = create<ProcessCO>();
+    std::unique_ptr<ServingPLMN> objServingPLMN = create<ServingPLMN>();
     std::unique_ptr<NonRankedUMTSSet> objNonRankedUMTSSet = create<NonRankedUMTSSet>();
     std::unique_ptr<ProcessCS> objProcessCS = create<ProcessCS>();
     std::unique_ptr<SimInfo> objSimInfo = create<SimInfo>();
