@@ -5,6 +5,7 @@
 #include "LogGenerator/Records/ClassIndex.h"
 #include "LogGenerator/ZOR_GSM/CellChangeCounters.h"
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
+#include "LogGenerator/ZOR_GSM/EquivalentPLMNList.h"
 #include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
 #include "LogGenerator/ZOR_GSM/NonRankedUMTSSet.h"
 #include "LogGenerator/ZOR_GSM/ProcessCO.h"
@@ -34,6 +35,7 @@ private:
     std::unique_ptr<NonRankedGSMSet> objNonRankedGSMSet = create<NonRankedGSMSet>();
     std::unique_ptr<ProcessCO> objProcessCO = create<ProcessCO>();
     std::unique_ptr<ServingPLMN> objServingPLMN = create<ServingPLMN>();
+    std::unique_ptr<EquivalentPLMNList> objEquivalentPLMNList = create<EquivalentPLMNList>();
     std::unique_ptr<NonRankedUMTSSet> objNonRankedUMTSSet = create<NonRankedUMTSSet>();
     std::unique_ptr<ProcessCS> objProcessCS = create<ProcessCS>();
     std::unique_ptr<SimInfo> objSimInfo = create<SimInfo>();
