@@ -7,6 +7,7 @@
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
 #include "LogGenerator/ZOR_GSM/EquivalentPLMNList.h"
 #include "LogGenerator/ZOR_GSM/GSMServingCell.h"
+#include "LogGenerator/ZOR_GSM/NeighboringCells.h"
 #include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
 #include "LogGenerator/ZOR_GSM/NonRankedUMTSSet.h"
 #include "LogGenerator/ZOR_GSM/ProcessCO.h"
@@ -29,6 +30,7 @@ public:
 private:
     std::unique_ptr<CodingScheme> objCodingScheme = create<CodingScheme>();
     std::unique_ptr<GSMServingCell> objGSMServingCell = create<GSMServingCell>();
+    std::unique_ptr<NeighboringCells> objNeighboringCells = create<NeighboringCells>();
     std::unique_ptr<PDPContextList> objPDPContextList = create<PDPContextList>();
     std::unique_ptr<ProcessPS> objProcessPS = create<ProcessPS>();
     std::unique_ptr<UMTSRRMeasurement> objUMTSRRMeasurement = create<UMTSRRMeasurement>();
