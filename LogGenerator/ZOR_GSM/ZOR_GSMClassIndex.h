@@ -6,6 +6,7 @@
 #include "LogGenerator/ZOR_GSM/CellChangeCounters.h"
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
 #include "LogGenerator/ZOR_GSM/EquivalentPLMNList.h"
+#include "LogGenerator/ZOR_GSM/GSMRRInfo.h"
 #include "LogGenerator/ZOR_GSM/GSMServingCell.h"
 #include "LogGenerator/ZOR_GSM/NeighboringCells.h"
 #include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
@@ -40,6 +41,7 @@ private:
     std::unique_ptr<ProcessCO> objProcessCO = create<ProcessCO>();
     std::unique_ptr<ServingPLMN> objServingPLMN = create<ServingPLMN>();
     std::unique_ptr<EquivalentPLMNList> objEquivalentPLMNList = create<EquivalentPLMNList>();
+    std::unique_ptr<GSMRRInfo> objGSMRRInfo = create<GSMRRInfo>();
     std::unique_ptr<NonRankedUMTSSet> objNonRankedUMTSSet = create<NonRankedUMTSSet>();
     std::unique_ptr<ProcessCS> objProcessCS = create<ProcessCS>();
     std::unique_ptr<SimInfo> objSimInfo = create<SimInfo>();
