@@ -8,6 +8,7 @@
 #include "LogGenerator/ZOR_GSM/EquivalentPLMNList.h"
 #include "LogGenerator/ZOR_GSM/GSMRRInfo.h"
 #include "LogGenerator/ZOR_GSM/GSMServingCell.h"
+#include "LogGenerator/ZOR_GSM/MobileAllocation.h"
 #include "LogGenerator/ZOR_GSM/NeighboringCells.h"
 #include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
 #include "LogGenerator/ZOR_GSM/NonRankedUMTSSet.h"
@@ -31,6 +32,7 @@ public:
 private:
     std::unique_ptr<CodingScheme> objCodingScheme = create<CodingScheme>();
     std::unique_ptr<GSMServingCell> objGSMServingCell = create<GSMServingCell>();
+    std::unique_ptr<MobileAllocation> objMobileAllocation = create<MobileAllocation>();
     std::unique_ptr<NeighboringCells> objNeighboringCells = create<NeighboringCells>();
     std::unique_ptr<PDPContextList> objPDPContextList = create<PDPContextList>();
     std::unique_ptr<ProcessPS> objProcessPS = create<ProcessPS>();
