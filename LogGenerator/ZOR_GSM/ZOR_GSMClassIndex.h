@@ -6,6 +6,7 @@
 #include "LogGenerator/ZOR_GSM/CellChangeCounters.h"
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
 #include "LogGenerator/ZOR_GSM/EquivalentPLMNList.h"
+#include "LogGenerator/ZOR_GSM/GPRSInformation.h"
 #include "LogGenerator/ZOR_GSM/GSMRRInfo.h"
 #include "LogGenerator/ZOR_GSM/GSMServingCell.h"
 #include "LogGenerator/ZOR_GSM/MobileAllocation.h"
@@ -31,6 +32,7 @@ public:
 
 private:
     std::unique_ptr<CodingScheme> objCodingScheme = create<CodingScheme>();
+    std::unique_ptr<GPRSInformation> objGPRSInformation = create<GPRSInformation>();
     std::unique_ptr<GSMServingCell> objGSMServingCell = create<GSMServingCell>();
     std::unique_ptr<MobileAllocation> objMobileAllocation = create<MobileAllocation>();
     std::unique_ptr<NeighboringCells> objNeighboringCells = create<NeighboringCells>();
