@@ -1,5 +1,6 @@
 #include "LogGenerator/Common/CellMonitor.h"
 
+#include "LogGenerator/Records/Formats.h"
 #include "platform/PropertyListCodec.h"
 #include "platform/SystemLog.h"
 #include "platform/TelephonyConstants.h"
@@ -56,6 +57,16 @@ std::optional<std::int32_t> cellNumber(const PropertyList& cell, std::string_vie
         systemLog(LogPriority::Error, "%s", failure);
     }
     return number;
+}
+
+void showCellNumbers(const DictionaryRef& target, std::span<const CellNumber> numbers,
+                     const PropertyList& cell) {
+    for (const CellNumber& number : numbers) {
+        const auto value = cellNumber(cell, number.cellKey, number.failure);
+        if (value && target != nullptr) {
+            target->setFixed(number.key, DisplayNumber(std::int64_t{*value}, kDecimal));
+        }
+    }
 }
 
 PropertyList cellLevel(std::int32_t number, const NumberFormat& format, int factor) {

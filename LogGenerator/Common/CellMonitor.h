@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <optional>
+#include <span>
 #include <string_view>
 
 /// The cell-monitor array: behind the header of the extended record 0xFF0001 stands a serialized
@@ -32,6 +33,19 @@ const PropertyList* findCell(const Array& cells, std::string_view radioAccessTec
 /// error priority, when it is missing or no such number.
 std::optional<std::int32_t> cellNumber(const PropertyList& cell, std::string_view key,
                                        std::string_view failure);
+
+/// One display key that shows a cell's number as decimal text, and the line that is logged when
+/// the cell has none.
+struct CellNumber {
+    std::string_view key;
+    std::string_view cellKey;
+    std::string_view failure;
+};
+
+/// Sets the key of every number that the cell has, in order; one that is missing stops no other.
+/// Without a target (null) there is nothing but the lines of what is missing.
+void showCellNumbers(const DictionaryRef& target, std::span<const CellNumber> numbers,
+                     const PropertyList& cell);
 
 /// A level as the cell monitor reports it: the low 16 bits, signed, times `factor`, under
 /// `format`; the empty string for 32767, which stands for "not measured".

@@ -63,6 +63,17 @@ void Base::show(std::span<const Field> fields, const LogRecord& record) {
     }
 }
 
+void Base::showGroup(std::span<const FieldGroup> groups, const LogRecord& record, LogCode logCode) {
+    const auto group = std::find_if(groups.begin(), groups.end(), [logCode](const auto& each) {
+        return each.logCode == logCode;
+    });
+    if (group == groups.end()) {
+        logUnknown(logCode);
+    } else if (record.has(group->minimumLength)) {
+        show(group->fields, record);
+    }
+}
+
 void Base::removeKey(std::string_view key) {
     if (const DictionaryRef section = _sectionRef.dictionary()) {
         (void)section->remove(key);

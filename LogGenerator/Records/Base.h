@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/Field.h"
+#include "LogGenerator/Records/FieldGroup.h"
 #include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/PropertyList.h"
@@ -67,6 +68,9 @@ protected:
     // For records whose section is a dictionary.
     void show(std::string_view key, PropertyList value);
     void show(std::span<const Field> fields, const LogRecord& record);
+    /// Shows the fields of the group for `logCode`. A record shorter than the group's minimum
+    /// changes nothing; a code that has no group is logged as unknown.
+    void showGroup(std::span<const FieldGroup> groups, const LogRecord& record, LogCode logCode);
     void removeKey(std::string_view key);
 
     // For records whose section is a list.

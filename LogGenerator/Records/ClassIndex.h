@@ -20,6 +20,8 @@ public:
     ClassIndex(const ClassIndex&) = delete;
     ClassIndex& operator=(const ClassIndex&) = delete;
 
+    /// Every record by its section name.
+    const ClassDict& classes() const { return classDict; }
     /// The record of that section, or null.
     Base* getClass(std::string_view sectionName) const;
     /// The records subscribed to the code in call order, or null when nobody wants it. Valid as

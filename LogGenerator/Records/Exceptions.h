@@ -22,16 +22,4 @@ public:
     }
 };
 
-/// The reader of the SIM-file record.
-class LogCode_0xFF000020 { // NOLINT(readability-identifier-naming): the record's own name
-public:
-    /// Thrown when the property list embedded in the record cannot be parsed.
-    class UnknownDataException : public std::exception {
-    public:
-        const char* what() const noexcept override {
-            return "the embedded property list cannot be parsed";
-        }
-    };
-};
-
 } // namespace pallax

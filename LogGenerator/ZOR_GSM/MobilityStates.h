@@ -1,7 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Field.h"
-#include "LogGenerator/Records/LogCode.h"
+#include "LogGenerator/Records/FieldGroup.h"
 
 #include <array>
 #include <cstddef>
@@ -67,5 +66,7 @@ static_assert(kMMStates.size() == 26);
 inline constexpr auto kRegistrationFields = std::to_array<Field>({
     {kServiceStateKey, u8At(13), Conversion::label(kRegistrationStates)},
 });
+inline constexpr FieldGroup kRegistrationGroup{kRegistrationLogCode, kStateRecordLength,
+                                               kRegistrationFields};
 
 } // namespace pallax

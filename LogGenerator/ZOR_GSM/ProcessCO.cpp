@@ -7,11 +7,15 @@ namespace pallax {
 
 namespace {
 
-constexpr auto kLogCodes = std::to_array<LogCode>({kMMStateLogCode, kRegistrationLogCode});
-
 constexpr auto kStateFields = std::to_array<Field>({
     {kMMStateKey, u8At(13), Conversion::label(kMMStates)},
 });
+
+constexpr auto kGroups = std::to_array<FieldGroup>({
+    {kMMStateLogCode, kStateRecordLength, kStateFields},
+    kRegistrationGroup,
+});
+constexpr auto kLogCodes = logCodesOf(kGroups);
 
 } // namespace
 
@@ -21,17 +25,7 @@ std::span<const LogCode> ProcessCO::getLogCodeArray() const {
 
 void ProcessCO::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "ProcessCS"); // the line of its sibling, on purpose
-    if (logCode != kRegistrationLogCode && logCode != kMMStateLogCode) {
-        return logUnknown(logCode);
-    }
-    if (!record.has(kStateRecordLength)) {
-        return;
-    }
-    if (logCode == kRegistrationLogCode) {
-        show(kRegistrationFields, record);
-    } else {
-        show(kStateFields, record);
-    }
+    showGroup(kGroups, record, logCode);
 }
 
 } // namespace pallax

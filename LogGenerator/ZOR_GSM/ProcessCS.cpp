@@ -7,8 +7,6 @@ namespace pallax {
 
 namespace {
 
-constexpr auto kLogCodes = std::to_array<LogCode>({kMMStateLogCode, kRegistrationLogCode});
-
 constexpr auto kSubStates = std::to_array<std::string_view>({
     "MM_NULL_SUBSTATE",
     "MM_NO_IMSI",
@@ -36,6 +34,12 @@ constexpr auto kStateFields = std::to_array<Field>({
     {"LU Reject Cause", u8At(15), Conversion::label(kRejectCauses)},
 });
 
+constexpr auto kGroups = std::to_array<FieldGroup>({
+    {kMMStateLogCode, kStateRecordLength, kStateFields},
+    kRegistrationGroup,
+});
+constexpr auto kLogCodes = logCodesOf(kGroups);
+
 } // namespace
 
 std::span<const LogCode> ProcessCS::getLogCodeArray() const {
@@ -44,17 +48,7 @@ std::span<const LogCode> ProcessCS::getLogCodeArray() const {
 
 void ProcessCS::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "ProcessCS");
-    if (logCode != kRegistrationLogCode && logCode != kMMStateLogCode) {
-        return logUnknown(logCode);
-    }
-    if (!record.has(kStateRecordLength)) {
-        return;
-    }
-    if (logCode == kRegistrationLogCode) {
-        show(kRegistrationFields, record);
-    } else {
-        show(kStateFields, record);
-    }
+    showGroup(kGroups, record, logCode);
 }
 
 } // namespace pallax

@@ -7,8 +7,6 @@ namespace pallax {
 
 namespace {
 
-constexpr auto kLogCodes = std::to_array<LogCode>({kGMMStateLogCode, kRegistrationLogCode});
-
 constexpr auto kGMMStates = std::to_array<std::string_view>({
     "GMM_NULL",
     "GMM_DEREGISTERED",
@@ -51,6 +49,12 @@ constexpr auto kStateFields = std::to_array<Field>({
     {"Attach Reject Cause", u8At(15), Conversion::label(kRejectCauses)},
 });
 
+constexpr auto kGroups = std::to_array<FieldGroup>({
+    {kGMMStateLogCode, kStateRecordLength, kStateFields},
+    kRegistrationGroup,
+});
+constexpr auto kLogCodes = logCodesOf(kGroups);
+
 } // namespace
 
 std::span<const LogCode> ProcessPS::getLogCodeArray() const {
@@ -59,17 +63,7 @@ std::span<const LogCode> ProcessPS::getLogCodeArray() const {
 
 void ProcessPS::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "ProcessPS");
-    if (logCode != kRegistrationLogCode && logCode != kGMMStateLogCode) {
-        return logUnknown(logCode);
-    }
-    if (!record.has(kStateRecordLength)) {
-        return;
-    }
-    if (logCode == kRegistrationLogCode) {
-        show(kRegistrationFields, record);
-    } else {
-        show(kStateFields, record);
-    }
+    showGroup(kGroups, record, logCode);
 }
 
 } // namespace pallax

@@ -43,6 +43,11 @@ public:
         return value != nullptr ? value->string().value_or("(no text)") : "(absent)";
     }
     RecordClass& record() { return _record; }
+    /// The codes that the record class wants, in its order.
+    std::vector<LogCode> subscriptions() const {
+        const auto codes = _record.getLogCodeArray();
+        return {codes.begin(), codes.end()};
+    }
 
     /// What the last record logged.
     std::vector<RecordingLog::Line> lines;

@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/ProcessCS.h"
 
 #include "tests/doubles/RecordFixture.h"
+#include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
 
@@ -102,6 +103,11 @@ TEST(ProcessCS, AnyOtherCodeIsUnknownAndChangesNothing) {
 TEST(ProcessCS, A15BytePacketOfAnySubscribedCodeChangesNothing) {
     cutAtEveryLength<ProcessCS>(state(19, 8, 0), 16);
     cutAtEveryLength<ProcessCS>(Record(0x7132).u8(1).padTo(16), 16);
+}
+
+TEST(ProcessCS, AnyBytesKeepWithinItsKeys) {
+    anyBytesKeepWithin<ProcessCS>(
+        {"MM Service State", "MM State", "MM Sub State", "LU Reject Cause"});
 }
 
 } // namespace

@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
 
 #include "tests/doubles/FakeStandardOutput.h"
+#include "tests/doubles/TemplateCheck.h"
 
 #include <gtest/gtest.h>
 
@@ -8,50 +9,113 @@ namespace pallax {
 namespace {
 
 using doubles::FakeStandardOutput;
+using Names = std::vector<std::string>;
 
-std::vector<std::string> subscribersOf(const ClassIndex& index, LogCode logCode) {
-    std::vector<std::string> names;
-    if (const auto* subscribers = index.getSubscribers(logCode)) {
-        for (const Base* record : *subscribers) {
+/// Who gets the packets of a log code, in call order.
+const std::map<LogCode, Names> kSubscribers = {
+    {0x4005, {"GSM Set", "UMTS Set"}},
+    {0x4031, {"UMTS RR Info"}},
+    {0x4116, {"BLER"}},
+    {0x4125, {"UMTS RR Info"}},
+    {0x4127, {"UMTS RR Info"}},
+    {0x4157, {"UMTS RR Info"}},
+    {0x417A, {"Active Set", "Detected Set", "Monitored Set", "Virtual Active Set"}},
+    {0x4221, {"HSDPA Info"}},
+    {0x5072, {"GSM RR Info"}},
+    {0x5076, {"GSM Serving Cell"}},
+    {0x512C, {"GSM RR Info"}},
+    {0x5134, {"GSM Serving Cell"}},
+    {0x5137, {"GPRS Information", "GSM Serving Cell", "Neighboring Cells", "GSM RR Info"}},
+    {0x51F4, {"GPRS Information"}},
+    {0x51F5, {"GPRS Information"}},
+    {0x51F6, {"GPRS Information", "GSM RR Info"}},
+    {0x51F8, {"Mobile Allocation"}},
+    {0x51FB, {"GPRS Information"}},
+    {0x51FD, {"GPRS Information"}},
+    {0x51FF, {"Neighboring Cells"}},
+    {0x7130, {"Process PS"}},
+    {0x7131, {"Process CO", "Process CS"}},
+    {0x7132, {"Process PS", "Process CO", "Serving PLMN", "Process CS"}},
+    {0x7135, {"GPRS Information", "Serving PLMN"}},
+    {0x7150, {"Equivalent PLMN List"}},
+    {0xFF0000, {"SIM Info"}},
+    {0xFF0001,
+     {"GSM Serving Cell", "Neighboring Cells", "Serving PLMN", "UMTS Set", "UMTS RR Info"}},
+    {0xFF0002, {"PDP Context Info"}},
+};
+
+class ZOR_GSMClassIndexTest : public testing::Test {
+protected:
+    Names subscribersOf(LogCode logCode) const {
+        Names names;
+        for (const Base* record : *_index.getSubscribers(logCode)) {
             names.emplace_back(record->getSectionName());
         }
+        return names;
     }
-    return names;
+
+    FakeStandardOutput _output;
+    ZOR_GSMClassIndex _index{_output};
+};
+
+TEST_F(ZOR_GSMClassIndexTest, SubscribersInCallOrder) {
+    for (const auto& [logCode, names] : kSubscribers) {
+        ASSERT_NE(_index.getSubscribers(logCode), nullptr) << std::hex << logCode;
+        EXPECT_EQ(subscribersOf(logCode), names) << std::hex << logCode;
+    }
 }
 
-TEST(ZOR_GSMClassIndex, SubscribersInCallOrder) {
-    FakeStandardOutput output;
-    const ZOR_GSMClassIndex index(output);
-    using Names = std::vector<std::string>;
-    EXPECT_EQ(subscribersOf(index, 0x7130), (Names{"Process PS"}));
-    EXPECT_EQ(subscribersOf(index, 0x7131), (Names{"Process CO", "Process CS"}));
-    EXPECT_EQ(subscribersOf(index, 0x7132), (Names{"Process PS", "Process CO", "Process CS"}));
-    EXPECT_EQ(subscribersOf(index, 0x7133), (Names{}));
+TEST_F(ZOR_GSMClassIndexTest, ItWantsExactlyTheCodesOfItsRecords) {
+    std::vector<std::string> codes;
+    for (const auto& [logCode, names] : kSubscribers) {
+        codes.push_back(std::to_string(logCode));
+    }
+    EXPECT_EQ(_index.getAllLogCodes(), codes);
+    EXPECT_EQ(_index.getSubscribers(0x7133), nullptr);
+}
+
+TEST_F(ZOR_GSMClassIndexTest, ItHolds26Sections) {
+    Names sections;
+    for (const auto& [name, record] : _index.classes()) {
+        sections.push_back(name);
+    }
+    EXPECT_EQ(sections, (Names{"Active Set",
+                               "BLER",
+                               "Cell Change Counters",
+                               "Coding Scheme",
+                               "Detected Set",
+                               "Equivalent PLMN List",
+                               "GPRS Information",
+                               "GSM RR Info",
+                               "GSM Serving Cell",
+                               "GSM Set",
+                               "HSDPA Info",
+                               "Mobile Allocation",
+                               "Monitored Set",
+                               "Neighboring Cells",
+                               "Non-Ranked GSM Set",
+                               "Non-Ranked UMTS Set",
+                               "PDP Context Info",
+                               "Process CO",
+                               "Process CS",
+                               "Process PS",
+                               "SIM Info",
+                               "Serving PLMN",
+                               "UMTS RR Info",
+                               "UMTS RR Measurement",
+                               "UMTS Set",
+                               "Virtual Active Set"}));
+}
+
+TEST_F(ZOR_GSMClassIndexTest, TemplateAndRecordsMatchBothWays) {
+    doubles::expectTemplateMatches(
+        doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"), _index);
 }
 
 TEST(ZOR_GSMClassIndex, ItsEndIsPrintedBeforeThatOfItsBase) {
     FakeStandardOutput output;
     { const ZOR_GSMClassIndex index(output); }
-    EXPECT_EQ(output.lines,
-              (std::vector<std::string>{"Deallocing ZOR_GSMClassIndex", "Deallocing ClassIndex"}));
-}
-
-TEST(ZOR_GSMClassIndex, SubscribersOfTheUMTSCodesInCallOrder) {
-    FakeStandardOutput output;
-    const ZOR_GSMClassIndex index(output);
-    using Names = std::vector<std::string>;
-    EXPECT_EQ(subscribersOf(index, 0x4005), (Names{"GSM Set", "UMTS Set"}));
-    for (const LogCode code : {0x4031U, 0x4125U, 0x4127U, 0x4157U}) {
-        EXPECT_EQ(subscribersOf(index, code), (Names{"UMTS RR Info"}));
-    }
-    EXPECT_EQ(subscribersOf(index, 0x4116), (Names{"BLER"}));
-    EXPECT_EQ(subscribersOf(index, 0x417A),
-              (Names{"Active Set", "Detected Set", "Monitored Set", "Virtual Active Set"}));
-    EXPECT_EQ(subscribersOf(index, 0x4221), (Names{"HSDPA Info"}));
-    const Names ofCellMonitor = subscribersOf(index, 0xFF0001);
-    ASSERT_GE(ofCellMonitor.size(), 2U);
-    EXPECT_EQ(Names(ofCellMonitor.end() - 2, ofCellMonitor.end()),
-              (Names{"UMTS Set", "UMTS RR Info"}));
+    EXPECT_EQ(output.lines, (Names{"Deallocing ZOR_GSMClassIndex", "Deallocing ClassIndex"}));
 }
 
 } // namespace

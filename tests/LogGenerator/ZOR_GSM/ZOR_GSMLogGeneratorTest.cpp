@@ -3,8 +3,8 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "platform/TelephonyConstants.h"
 #include "tests/doubles/GeneratorFixture.h"
-#include "tests/doubles/RecordBuilder.h"
-#include "tests/doubles/RecordingLog.h"
+#include "tests/doubles/RecordFixture.h"
+#include "tests/doubles/TemplateCheck.h"
 
 #include <gtest/gtest.h>
 
@@ -50,6 +50,43 @@ TEST(ZOR_GSMLogGenerator, UsesTheTemplateZOR_GSM) {
                   {"Process PS", Dictionary{{"MM State", "GMM_REGISTERED"},
                                             {"MM Sub State", "GMM_NORMAL_SERVICE"},
                                             {"Attach Reject Cause", "GMM_GU1_UPDATED"}}}}));
+}
+
+TEST(ZOR_GSMLogGenerator, TheStartCommandHoldsExactlyTheCodesOfItsRecords) {
+    GeneratorFixture fixture;
+    const auto generator = ZOR_GSMLogGenerator::generator(fixture.environment());
+    Array codes;
+    for (const LogCode logCode :
+         {0x4005, 0x4031, 0x4116, 0x4125, 0x4127, 0x4157, 0x417A, 0x4221, 0x5072,
+          0x5076, 0x512C, 0x5134, 0x5137, 0x51F4, 0x51F5, 0x51F6, 0x51F8, 0x51FB,
+          0x51FD, 0x51FF, 0x7130, 0x7131, 0x7132, 0x7135, 0x7150}) {
+        codes.push_back(PropertyList::integer(logCode));
+    }
+    const Array extraCodes = {PropertyList::integer(0), PropertyList::integer(1),
+                              PropertyList::integer(2)};
+    doubles::expectInOrder(generator->getStartCommand(),
+                           Dictionary{{"SetState", "Streaming"},
+                                      {"SetZorellLogCodes", codes},
+                                      {"SetHxExtraCodes", extraCodes}});
+}
+
+TEST(ZOR_GSMLogGenerator, SectionsWithoutACodeExistFromTheStartAndNeverChange) {
+    GeneratorFixture fixture;
+    fixture.resources.add("ZOR_GSM",
+                          doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"));
+    const auto generator = ZOR_GSMLogGenerator::generator(fixture.environment());
+    Dictionary state;
+    for (const unsigned logCode : {0x7130U, 0x5137U, 0x417AU, 0x4005U, 0x1234U}) {
+        generator->updateState(state, Record(logCode).padTo(200).bytes());
+    }
+    const DictionaryRef display = state.find("Display")->dictionary();
+    ASSERT_EQ(display->size(), 26U);
+    for (const char* section : {"Coding Scheme", "Cell Change Counters", "UMTS RR Measurement"}) {
+        EXPECT_EQ(*display->find(section), PropertyList(Dictionary())) << section;
+    }
+    for (const char* section : {"Non-Ranked GSM Set", "Non-Ranked UMTS Set"}) {
+        EXPECT_EQ(*display->find(section), PropertyList(Array())) << section;
+    }
 }
 
 TEST(Technologies, TheGSMIdentifierGivesTheGSMGenerator) {

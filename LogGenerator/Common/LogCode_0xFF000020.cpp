@@ -1,0 +1,22 @@
+#include "LogGenerator/Common/LogCode_0xFF000020.h"
+
+#include "platform/PropertyListCodec.h"
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+LogCode_0xFF000020::LogCode_0xFF000020(const LogRecord& record) {
+    PropertyListResult parsed = parsePropertyList(record.payload());
+    if (!parsed) {
+        systemLog(LogPriority::Error, "SIM File dictionary data could not be constructed");
+        throw UnknownDataException();
+    }
+    _files = std::move(parsed).value();
+}
+
+const PropertyList* LogCode_0xFF000020::file(std::string_view key) const {
+    const DictionaryRef files = _files.dictionary();
+    return files != nullptr ? files->find(key) : nullptr;
+}
+
+} // namespace pallax

@@ -1,0 +1,27 @@
+#include "LogGenerator/Common/PDPContextList.h"
+
+#include "platform/PropertyListCodec.h"
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr auto kLogCodes = std::to_array<LogCode>({kPDPContextsLogCode});
+
+} // namespace
+
+std::span<const LogCode> PDPContextList::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+void PDPContextList::updateWithData(const LogRecord& record, LogCode /*logCode*/) {
+    systemLog(LogPriority::Warning, "PDPContextList");
+    const PropertyListResult parsed = parsePropertyList(record.payload());
+    const ArrayRef contexts = parsed ? parsed->array() : nullptr;
+    if (contexts != nullptr) {
+        replaceList(*contexts);
+    }
+}
+
+} // namespace pallax

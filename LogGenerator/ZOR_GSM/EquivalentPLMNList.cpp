@@ -1,0 +1,48 @@
+#include "LogGenerator/ZOR_GSM/EquivalentPLMNList.h"
+
+#include "LogGenerator/Records/EntryList.h"
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr LogCode kEquivalentPLMNLogCode = 0x7150;
+constexpr auto kLogCodes = std::to_array<LogCode>({kEquivalentPLMNLogCode});
+
+constexpr std::size_t kMinimumLength = 17;
+constexpr std::size_t kCountOffset = 16;
+constexpr EntryList::Layout kEntries{.start = 17, .stride = 3, .bytesRead = 6};
+
+/// Three digits, every second byte from `at` on.
+PropertyList codeAt(const LogRecord& entry, std::size_t at) {
+    const int code = entry.u8(at) * 100 + entry.u8(at + 2) * 10 + entry.u8(at + 4);
+    return DisplayNumber(std::int64_t{code}, kDecimal);
+}
+
+PropertyList networkOf(const LogRecord& entry) {
+    Dictionary network;
+    network.setFixed("Mobile Country Code", codeAt(entry, 0));
+    network.setFixed("Mobile Network Code", codeAt(entry, 1));
+    return network;
+}
+
+} // namespace
+
+std::span<const LogCode> EquivalentPLMNList::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+void EquivalentPLMNList::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Warning, "Equivalent PLMN List");
+    if (logCode != kEquivalentPLMNLogCode) {
+        return logUnknown(logCode);
+    }
+    if (!record.has(kMinimumLength)) {
+        return;
+    }
+    const EntryList entries(record, kEntries, record.u8(kCountOffset));
+    replaceList(entries.map([](const LogRecord& entry, std::size_t) { return networkOf(entry); }));
+}
+
+} // namespace pallax

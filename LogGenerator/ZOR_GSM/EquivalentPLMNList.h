@@ -1,0 +1,28 @@
+#pragma once
+
+#include "LogGenerator/Records/Base.h"
+
+namespace pallax {
+
+/// The networks that the current one treats as equivalent, section "Equivalent PLMN List".
+///
+///   0x7150, at least 17 bytes
+///   byte  width  field
+///   16    8      number of entries
+///   17           entries, each 3 bytes behind the one before it, though 6 bytes are read of each
+///
+///   entry
+///   byte        key                    shown as
+///   0, 2, 4     Mobile Country Code    number: 100 x byte 0 + 10 x byte 2 + byte 4
+///   1, 3, 5     Mobile Network Code    number: 100 x byte 1 + 10 x byte 3 + byte 5
+///
+/// So neighbouring entries overlap by three bytes. The bytes are whole digits, none is refused.
+class EquivalentPLMNList final : public Base {
+public:
+    std::string_view getSectionName() const override { return "Equivalent PLMN List"; }
+    std::span<const LogCode> getLogCodeArray() const override;
+    SectionKind sectionKind() const override { return SectionKind::List; }
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
+};
+
+} // namespace pallax

@@ -1,0 +1,42 @@
+#include "LogGenerator/ZOR_GSM/MobileAllocation.h"
+
+#include "LogGenerator/Records/EntryList.h"
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr LogCode kMobileAllocationLogCode = 0x51F8;
+constexpr auto kLogCodes = std::to_array<LogCode>({kMobileAllocationLogCode});
+
+constexpr std::size_t kMinimumLength = 15;
+constexpr std::size_t kCountOffset = 14;
+constexpr EntryList::Layout kChannels{.start = 15, .stride = 2, .bytesRead = 2};
+
+constexpr auto kFields = std::to_array<Field>({
+    {"HSN", u8At(13), Conversion::number()},
+});
+
+} // namespace
+
+std::span<const LogCode> MobileAllocation::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+void MobileAllocation::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Warning, "MobileAllocation");
+    if (logCode != kMobileAllocationLogCode) {
+        return logUnknown(logCode);
+    }
+    if (!record.has(kMinimumLength)) {
+        return;
+    }
+    show(kFields, record);
+    const EntryList channels(record, kChannels, record.u8(kCountOffset));
+    show("ARFCNs", channels.map([](const LogRecord& channel, std::size_t) {
+        return DisplayNumber(std::int64_t{channel.u16(0)}, kDecimal);
+    }));
+}
+
+} // namespace pallax

@@ -1,0 +1,121 @@
+#include "LogGenerator/ZOR_GSM/NeighboringCells.h"
+
+#include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/EntryList.h"
+#include "LogGenerator/ZOR_GSM/SharedLogCodes.h"
+#include "platform/SystemLog.h"
+#include "platform/TelephonyConstants.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr LogCode kBsicListLogCode = 0x51FF;
+constexpr auto kLogCodes =
+    std::to_array<LogCode>({kMeasurementLogCode, kBsicListLogCode, kCellMonitorLogCode});
+
+constexpr std::size_t kNeighbourCountOffset = 28;
+constexpr EntryList::Layout kNeighbours{.start = 29, .stride = 14, .bytesRead = 7};
+
+constexpr std::size_t kBsicListMinimumLength = 15;
+constexpr std::size_t kBsicCountOffset = 14;
+constexpr EntryList::Layout kBsics{.start = 15, .stride = 4, .bytesRead = 3};
+constexpr std::size_t kArfcnInEntry = 0;
+constexpr std::size_t kBsicInEntry = 2;
+
+constexpr std::string_view kARFCNKey = "ARFCN";
+constexpr std::string_view kRSSIKey = "RSSI";
+
+constexpr auto kNeighbourFields = std::to_array<Field>({
+    {kARFCNKey, u16At(kArfcnInEntry), Conversion::number()},
+    {kRSSIKey, u8At(2), Conversion::number()},
+    {"C1 Value", s32At(3), Conversion::number()},
+});
+
+constexpr auto kCellNumbers = std::to_array<CellNumber>({
+    {kARFCNKey, kHXCellMonitorARFCN, "NeighboringCells: Failed to retrieve ARFCN\n"},
+});
+
+/// The cell monitor counts levels in steps of this many dBm.
+constexpr int kRssiStepDbm = 2;
+
+PropertyList monitoredCell(const PropertyList& cell) {
+    const auto entry = std::make_shared<Dictionary>();
+    showCellNumbers(entry, kCellNumbers, cell);
+    if (const auto rssi =
+            cellNumber(cell, kHXCellMonitorRSSI, "NeighboringCells: Failed to retrieve RSSI\n")) {
+        entry->setFixed(kRSSIKey, cellLevel(*rssi, kDecimalDbm, kRssiStepDbm));
+    }
+    return entry;
+}
+
+} // namespace
+
+std::span<const LogCode> NeighboringCells::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+void NeighboringCells::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Warning, "NeighboringCells");
+    switch (logCode) {
+    case kMeasurementLogCode:
+        showMeasuredCells(record);
+        break;
+    case kBsicListLogCode:
+        rememberBsics(record);
+        break;
+    case kCellMonitorLogCode:
+        showMonitoredCells(record);
+        break;
+    default:
+        logUnknown(logCode);
+        break;
+    }
+}
+
+void NeighboringCells::showMeasuredCells(const LogRecord& record) {
+    if (!record.has(kMeasurementLength)) {
+        return;
+    }
+    const EntryList neighbours(record, kNeighbours, record.u8(kNeighbourCountOffset));
+    replaceList(neighbours.map(
+        [this](const LogRecord& entry, std::size_t) { return measuredCell(entry); }));
+}
+
+PropertyList NeighboringCells::measuredCell(const LogRecord& entry) const {
+    Dictionary cell = entryOf(kNeighbourFields, entry);
+    const auto bsic = arfcnToBsic.find(entry.u16(kArfcnInEntry));
+    if (bsic != arfcnToBsic.end()) {
+        cell.setFixed("BSIC", DisplayNumber(std::int64_t{bsic->second}, kDecimal));
+    }
+    return cell;
+}
+
+void NeighboringCells::rememberBsics(const LogRecord& record) {
+    if (!record.has(kBsicListMinimumLength)) {
+        return;
+    }
+    arfcnToBsic.clear(); // also when the new list is empty
+    const EntryList bsics(record, kBsics, record.u8(kBsicCountOffset));
+    for (std::size_t index = 0; index < bsics.wholeCount(); ++index) {
+        const LogRecord entry = bsics.at(index);
+        arfcnToBsic.insert_or_assign(entry.u16(kArfcnInEntry), entry.u8(kBsicInEntry));
+    }
+}
+
+void NeighboringCells::showMonitoredCells(const LogRecord& record) {
+    clearList(); // what cannot be read leaves the list empty
+    const std::optional<Array> cells = readCellMonitorArray(record);
+    if (!cells) {
+        return logNoCellArray();
+    }
+    Array neighbours;
+    for (const PropertyList& cell : *cells) {
+        if (isCell(cell, kHXCellMonitorRadioAccessTechnologyGSM, kHXCellMonitorCellTypeNeighbor)) {
+            neighbours.push_back(monitoredCell(cell));
+        }
+    }
+    replaceList(std::move(neighbours));
+}
+
+} // namespace pallax

@@ -1,0 +1,55 @@
+#pragma once
+
+#include "LogGenerator/Records/Base.h"
+
+#include <cstdint>
+#include <unordered_map>
+
+namespace pallax {
+
+/// The measured neighbour cells, section "Neighboring Cells".
+///
+///   0x5137, at least 29 bytes
+///   byte  width  field
+///   28    8      number of entries
+///   29           entries, 14 bytes each
+///
+///   entry
+///   byte  width  key         shown as
+///   0     16     ARFCN       number
+///   2     8      RSSI        number, without a unit
+///   3     32     C1 Value    number, signed
+///                BSIC        number; only for an ARFCN that the last 0x51FF told
+///
+///   0x51FF, at least 15 bytes; remembered for the lists to come, shows nothing itself
+///   byte  width  field
+///   14    8      number of entries
+///   15           entries, 4 bytes each
+///
+///   entry
+///   byte  width  field
+///   0     16     ARFCN
+///   2     8      BSIC
+///
+///   0xFF0001, the cell-monitor array: every neighbour cell of GSM
+///   kHXCellMonitorARFCN    ARFCN    number
+///   kHXCellMonitorRSSI     RSSI     low 16 bits, signed, x 2, dBm; empty for 32767
+///
+/// Whichever of 0x5137 and 0xFF0001 came last makes the list.
+class NeighboringCells final : public Base {
+public:
+    std::string_view getSectionName() const override { return "Neighboring Cells"; }
+    std::span<const LogCode> getLogCodeArray() const override;
+    SectionKind sectionKind() const override { return SectionKind::List; }
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
+
+private:
+    void showMeasuredCells(const LogRecord& record);
+    void rememberBsics(const LogRecord& record);
+    void showMonitoredCells(const LogRecord& record);
+    PropertyList measuredCell(const LogRecord& entry) const;
+
+    std::unordered_map<std::uint16_t, std::uint8_t> arfcnToBsic;
+};
+
+} // namespace pallax

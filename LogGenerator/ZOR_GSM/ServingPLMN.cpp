@@ -1,0 +1,120 @@
+#include "LogGenerator/ZOR_GSM/ServingPLMN.h"
+
+#include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/ZOR_GSM/MobilityStates.h"
+#include "LogGenerator/ZOR_GSM/SharedLogCodes.h"
+#include "platform/SystemLog.h"
+#include "platform/TelephonyConstants.h"
+
+#include <algorithm>
+
+namespace pallax {
+
+namespace {
+
+constexpr auto kLogCodes =
+    std::to_array<LogCode>({kServingPLMNLogCode, kRegistrationLogCode, kCellMonitorLogCode});
+
+constexpr std::string_view kCountryCodeKey = "Mobile Country Code";
+constexpr std::string_view kNetworkCodeKey = "Mobile Network Code";
+constexpr std::string_view kLocationAreaCodeKey = "Location Area Code";
+
+constexpr auto kSelectionModes = std::to_array<std::string_view>({
+    "Automatic",
+    "Manual",
+    "Limited",
+    "LIMITED_ROUTINE_ACQ",
+    "LIMITED_MANUAL_ACQ",
+});
+static_assert(kSelectionModes.size() == 5);
+
+constexpr auto kServiceTypes = std::to_array<std::string_view>({
+    "NO_SERVICE",
+    "CS_ONLY",
+    "PS_ONLY",
+    "CS_PS_SERVICE",
+    "LIMITED_SERVICE",
+});
+static_assert(kServiceTypes.size() == 5);
+
+constexpr auto kSelectionFields = std::to_array<Field>({
+    {"PLMN Sel Mod", u8At(14), Conversion::label(kSelectionModes)},
+});
+
+/// Behind the two codes, which are digits.
+constexpr auto kNetworkFields = std::to_array<Field>({
+    {kLocationAreaCodeKey, bigEndianU16At(18), Conversion::number()},
+    {"Routing Area Code", u8At(20), Conversion::number()},
+    {"Service Type", u8At(14), Conversion::label(kServiceTypes)},
+});
+
+constexpr auto kCellNumbers = std::to_array<CellNumber>({
+    {kCountryCodeKey, kHXCellMonitorMCC, "ServingPLMN: Failed to retrieve MCC\n"},
+    {kNetworkCodeKey, kHXCellMonitorMNC, "ServingPLMN: Failed to retrieve MNC\n"},
+    {kLocationAreaCodeKey, kHXCellMonitorLAC, "ServingPLMN: Failed to retrieve LAC\n"},
+});
+
+char lowDigit(std::uint8_t octet) {
+    constexpr std::uint8_t kNibble = 0x0F;
+    const auto digit = octet & kNibble;
+    return digit <= 9 ? static_cast<char>('0' + digit) : ' ';
+}
+
+char highDigit(std::uint8_t octet) {
+    return lowDigit(octet >> 4U);
+}
+
+bool isServing(const PropertyList& cell) {
+    return isCell(cell, kHXCellMonitorRadioAccessTechnologyGSM, kHXCellMonitorCellTypeServing) ||
+           isCell(cell, kHXCellMonitorRadioAccessTechnologyUMTS, kHXCellMonitorCellTypeServing);
+}
+
+} // namespace
+
+std::span<const LogCode> ServingPLMN::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+void ServingPLMN::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Warning, "Serving PLMN");
+    switch (logCode) {
+    case kRegistrationLogCode:
+        if (record.has(kStateRecordLength)) {
+            show(kSelectionFields, record);
+        }
+        break;
+    case kServingPLMNLogCode:
+        if (record.has(kServingPLMNLength)) {
+            showNetwork(record);
+        }
+        break;
+    case kCellMonitorLogCode:
+        showServingCell(record);
+        break;
+    default:
+        logUnknown(logCode);
+        break;
+    }
+}
+
+void ServingPLMN::showNetwork(const LogRecord& record) {
+    const std::uint8_t first = record.u8(15);
+    const std::uint8_t second = record.u8(16);
+    const std::uint8_t third = record.u8(17);
+    show(kCountryCodeKey, std::string{lowDigit(first), highDigit(first), lowDigit(second)});
+    show(kNetworkCodeKey, std::string{lowDigit(third), highDigit(third), highDigit(second)});
+    show(kNetworkFields, record);
+}
+
+void ServingPLMN::showServingCell(const LogRecord& record) {
+    const std::optional<Array> cells = readCellMonitorArray(record);
+    if (!cells) {
+        return logNoCellArray();
+    }
+    const auto cell = std::find_if(cells->begin(), cells->end(), isServing);
+    if (cell != cells->end()) {
+        showCellNumbers(sectionRef().dictionary(), kCellNumbers, *cell);
+    }
+}
+
+} // namespace pallax

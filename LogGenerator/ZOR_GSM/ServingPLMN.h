@@ -1,0 +1,44 @@
+#pragma once
+
+#include "LogGenerator/Records/Base.h"
+
+namespace pallax {
+
+/// The network that the phone is on, section "Serving PLMN".
+///
+///   0x7132, at least 16 bytes
+///   byte  width  key                   shown as
+///   14    8      PLMN Sel Mod          label (kSelectionModes), "Unknown" beyond
+///
+///   0x7135, at least 32 bytes; keys in this order
+///   byte  nibble    key                    shown as
+///   15    low       Mobile Country Code    digit 1
+///   15    high                             digit 2
+///   16    low                              digit 3
+///   17    low       Mobile Network Code    digit 1
+///   17    high                             digit 2
+///   16    high                             digit 3
+///   byte  width
+///   18    16        Location Area Code     number, big-endian
+///   20    8         Routing Area Code      number
+///   14    8         Service Type           label (kServiceTypes), "Unknown" beyond
+///
+///   0xFF0001, the cell-monitor array: the first serving cell of GSM or UMTS
+///   kHXCellMonitorMCC    Mobile Country Code    number
+///   kHXCellMonitorMNC    Mobile Network Code    number
+///   kHXCellMonitorLAC    Location Area Code     number
+///
+/// Digits above 9 show as a blank: a two-digit network code ends in one when it comes from 0x7135,
+/// and does not when it comes from the cell monitor.
+class ServingPLMN final : public Base {
+public:
+    std::string_view getSectionName() const override { return "Serving PLMN"; }
+    std::span<const LogCode> getLogCodeArray() const override;
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
+
+private:
+    void showNetwork(const LogRecord& record);
+    void showServingCell(const LogRecord& record);
+};
+
+} // namespace pallax

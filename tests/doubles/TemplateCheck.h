@@ -1,0 +1,53 @@
+#pragma once
+
+#include "LogGenerator/Records/ClassIndex.h"
+#include "platform/PropertyListCodec.h"
+
+#include <gtest/gtest.h>
+
+#include <fstream>
+#include <iterator>
+#include <map>
+#include <string>
+
+namespace pallax::doubles {
+
+/// The property list in a file of the source tree; null, with a failed expectation, without one.
+inline PropertyList propertyListFile(const std::string& path) {
+    std::ifstream file(path, std::ios::binary);
+    const ByteBuffer bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+    const PropertyListResult parsed = parsePropertyList(bytes);
+    EXPECT_TRUE(parsed) << path;
+    return parsed ? *parsed : PropertyList();
+}
+
+/// Every key of a template, at any depth, with its value.
+inline void collectKeys(const PropertyList& object, std::map<std::string, PropertyList>& keys) {
+    if (const DictionaryRef entries = object.dictionary()) {
+        for (const Dictionary::Entry& entry : *entries) {
+            keys[entry.key.string()] = entry.value;
+            collectKeys(entry.value, keys);
+        }
+    }
+}
+
+/// Holds a template and a class index against each other: every record has its section, of the
+/// kind that it needs and empty at the start, and every section has its record.
+inline void expectTemplateMatches(const PropertyList& templateObject, const ClassIndex& index) {
+    std::map<std::string, PropertyList> keys;
+    collectKeys(templateObject, keys);
+    for (const auto& [name, record] : index.classes()) {
+        ASSERT_TRUE(keys.contains(name)) << name << " is missing in the template";
+        const PropertyList& section = keys.at(name);
+        if (record->sectionKind() == SectionKind::List) {
+            EXPECT_EQ(section, PropertyList(Array())) << name << " is a list";
+        } else {
+            EXPECT_EQ(section, PropertyList(Dictionary())) << name << " holds keys";
+        }
+    }
+    for (const auto& [name, value] : keys) {
+        EXPECT_NE(index.getClass(name), nullptr) << name << " has no record";
+    }
+}
+
+} // namespace pallax::doubles
