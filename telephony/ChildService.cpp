@@ -91,11 +91,6 @@ std::vector<std::string> argumentsFor(const ServiceOptions& options) {
     ::_exit(kExecFailed);
 }
 
-/// Ctrl-C at the terminal reaches the whole group; the viewer decides when the child ends.
-void leaveProcessGroup(pid_t process) {
-    (void)::setpgid(process, process);
-}
-
 bool hasEnded(pid_t process) {
     const pid_t result = ::waitpid(process, nullptr, WNOHANG);
     return result == process || (result < 0 && errno == ECHILD);

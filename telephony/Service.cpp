@@ -2,11 +2,11 @@
 
 #include "host/AsioMainQueue.h"
 #include "host/SocketMessagePorts.h"
-#include "platform/Format.h"
 #include "telephony/RecordingSource.h"
 #include "telephony/StreamSource.h"
 #include "telephony/TelephonyServer.h"
 
+#include <array>
 #include <charconv>
 #include <cmath>
 #include <csignal>
@@ -70,7 +70,12 @@ int serve(const ServiceOptions& options, const std::function<void()>& ready,
 } // namespace
 
 std::string speedText(double speed) {
-    return std::isinf(speed) ? std::string(kAsFastAsTakenText) : formatText("%.6f", {speed});
+    if (std::isinf(speed)) {
+        return std::string(kAsFastAsTakenText);
+    }
+    std::array<char, 32> text{}; // the shortest form that reads back the same needs 24
+    const auto result = std::to_chars(text.data(), text.data() + text.size(), speed);
+    return {text.data(), result.ptr};
 }
 
 std::optional<double> parseSpeed(const std::string& text) {

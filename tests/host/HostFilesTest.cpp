@@ -1,0 +1,169 @@
+#include "host/BuildBundle.h"
+#include "host/DirectoryResources.h"
+#include "host/FilePreferences.h"
+#include "host/Files.h"
+#include "host/HostFileSystem.h"
+#include "host/WallClock.h"
+#include "platform/PropertyListCodec.h"
+#include "tests/doubles/RuntimeFolder.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <ctime>
+#include <regex>
+#include <sys/stat.h>
+
+namespace pallax {
+namespace {
+
+class HostFilesTest : public testing::Test {
+protected:
+    PropertyList parsed(std::string_view name) const {
+        const auto content = readFile(_folder.file(name), kLargestPropertyList);
+        const auto result = parsePropertyList(content ? Bytes(*content) : Bytes());
+        return result ? *result : PropertyList();
+    }
+    std::vector<std::string> namesIn(std::string_view folder) const {
+        std::vector<std::string> names;
+        for (const auto& entry : std::filesystem::directory_iterator(_folder.file(folder))) {
+            names.push_back(entry.path().filename());
+        }
+        return names;
+    }
+
+    doubles::RuntimeFolder _folder;
+};
+
+TEST_F(HostFilesTest, APropertyListIsWrittenAsXmlAndAFailureIsTold) {
+    HostFileSystem files;
+    const PropertyList object(Dictionary{{"Description", "tunnel"}});
+    EXPECT_TRUE(files.writePropertyList(_folder.file("a.pallax"), object));
+    EXPECT_EQ(parsed("a.pallax"), object);
+    EXPECT_FALSE(files.writePropertyList(_folder.file("absent/a.pallax"), object));
+    EXPECT_FALSE(files.writePropertyList("/dev/full", object));
+}
+
+TEST_F(HostFilesTest, WhatCannotBeSerialisedLeavesTheFileAlone) {
+    HostFileSystem files;
+    (void)_folder.write("a.pallax", "before");
+    EXPECT_FALSE(files.writePropertyList(_folder.file("a.pallax"), PropertyList()));
+    EXPECT_EQ(doubles::contentOf(_folder.file("a.pallax")), "before");
+}
+
+TEST_F(HostFilesTest, ExistsSeesFilesAndFolders) {
+    const HostFileSystem files;
+    EXPECT_TRUE(files.exists(_folder.path()));
+    EXPECT_FALSE(files.exists(_folder.file("absent")));
+}
+
+TEST_F(HostFilesTest, PreferencesAreKeptPerDomainInOneFileEach) {
+    FilePreferences preferences(_folder.file("p"));
+    preferences.setValue("PLShowGSMRSSI", PropertyList::boolean(false), "com.norvane.screen");
+    EXPECT_FALSE(std::filesystem::exists(_folder.file("p"))); // not before synchronize
+    EXPECT_TRUE(preferences.synchronize("com.norvane.screen"));
+    EXPECT_TRUE(preferences.synchronize("nothing was set here"));
+    EXPECT_EQ(parsed("p/com.norvane.screen.plist"),
+              PropertyList(Dictionary{{"PLShowGSMRSSI", PropertyList::boolean(false)}}));
+    EXPECT_EQ(namesIn("p"), (std::vector<std::string>{"com.norvane.screen.plist"}));
+}
+
+TEST_F(HostFilesTest, OtherValuesOfADomainStay) {
+    {
+        FilePreferences preferences(_folder.file("p"));
+        preferences.setValue("kept", "old", "a/domain");
+        preferences.setValue("changed", "old", "a/domain");
+        ASSERT_TRUE(preferences.synchronize("a/domain"));
+    }
+    FilePreferences preferences(_folder.file("p"));
+    preferences.setValue("changed", "new", "a/domain");
+    ASSERT_TRUE(preferences.synchronize("a/domain"));
+    preferences.postChangedNotice("a/domain", "changed");
+    EXPECT_EQ(parsed("p/a%2Fdomain.plist"),
+              PropertyList(Dictionary{{"kept", "old"}, {"changed", "new"}}));
+}
+
+TEST_F(HostFilesTest, AnUnreadablePreferenceFileIsNotOverwritten) {
+    ASSERT_EQ(::mkdir(_folder.file("p").c_str(), 0700), 0);
+    (void)_folder.write("p/d.plist", "<plist><broken");
+    FilePreferences preferences(_folder.file("p"));
+    preferences.setValue("key", "value", "d");
+    EXPECT_FALSE(preferences.synchronize("d"));
+    EXPECT_EQ(doubles::contentOf(_folder.file("p/d.plist")), "<plist><broken");
+}
+
+TEST_F(HostFilesTest, PreferencesLieInTheUsersConfiguration) {
+    (void)::setenv("XDG_CONFIG_HOME", "/some/config", 1);
+    EXPECT_EQ(FilePreferences::userFolder(), "/some/config/pallax/preferences");
+    (void)::unsetenv("XDG_CONFIG_HOME");
+    (void)::setenv("HOME", "/some/home", 1);
+    EXPECT_EQ(FilePreferences::userFolder(), "/some/home/.config/pallax/preferences");
+}
+
+TEST_F(HostFilesTest, ResourcesAreFoundByNameAndListedSorted) {
+    const std::string text = "<plist version=\"1.0\"><dict/></plist>";
+    std::filesystem::create_directories(_folder.file("r/sub"));
+    (void)_folder.write("r/Z.plist", text);
+    (void)_folder.write("r/broken.plist", "<plist>");
+    (void)_folder.write("r/readme.txt", "x");
+    (void)_folder.write("r/sub/UTRAN.plist", text);
+    const DirectoryResources resources(_folder.file("r"));
+    EXPECT_EQ(resources.propertyList("Z"), PropertyList(Dictionary()));
+    EXPECT_EQ(resources.propertyList("broken"), std::nullopt);
+    EXPECT_EQ(resources.propertyList("absent"), std::nullopt);
+    EXPECT_EQ(resources.propertyList("sub/UTRAN"), std::nullopt);
+    EXPECT_EQ(resources.propertyList(""), std::nullopt);
+    EXPECT_EQ(resources.propertyListPaths(),
+              (std::vector<std::string>{_folder.file("r/Z.plist"), _folder.file("r/broken.plist"),
+                                        _folder.file("r/sub/UTRAN.plist")}));
+    EXPECT_EQ(DirectoryResources(_folder.file("absent")).propertyListPaths(),
+              std::vector<std::string>());
+}
+
+TEST_F(HostFilesTest, TheResourceFolderMayBeChosen) {
+    (void)::setenv("PALLAX_RESOURCES", "/some/folder", 1);
+    EXPECT_EQ(DirectoryResources::programFolder(), "/some/folder");
+    (void)::unsetenv("PALLAX_RESOURCES");
+    // This test runs from its build folder.
+    EXPECT_EQ(DirectoryResources::programFolder(), PALLAX_SOURCE_DIR "/resources");
+}
+
+TEST_F(HostFilesTest, AFileAboveTheLimitIsNotRead) {
+    (void)_folder.write("f", "12345");
+    EXPECT_EQ(readFile(_folder.file("f"), 5)->size(), 5U);
+    EXPECT_EQ(readFile(_folder.file("f"), 4), std::nullopt);
+    EXPECT_EQ(readFile(_folder.file("absent"), 4), std::nullopt);
+    EXPECT_EQ(readFile(_folder.path(), 4), std::nullopt);
+}
+
+TEST(BuildBundle, HasAVersionAndTheMomentOfTheBuild) {
+    const BuildBundle bundle;
+    EXPECT_THAT(bundle.version(), testing::Optional(testing::MatchesRegex("[0-9]+.[0-9]+.[0-9]+")));
+    const std::regex form("[A-Z][a-z]{2} [ 1-3][0-9] [0-9]{4} [0-9]{2}:[0-9]{2}:[0-9]{2}");
+    EXPECT_TRUE(std::regex_match(bundle.buildDate(), form)) << bundle.buildDate();
+}
+
+TEST(WallClock, KnowsTheZoneInForceAtATime) {
+    (void)::setenv("TZ", "CET-1CEST,M3.5.0,M10.5.0/3", 1);
+    ::tzset();
+    const WallClock clock;
+    const auto winter = clock.zone(Time(std::chrono::seconds(1700000000)));
+    EXPECT_EQ(winter.offset, std::chrono::hours(1));
+    EXPECT_FALSE(winter.daylightSaving);
+    const auto summer = clock.zone(Time(std::chrono::seconds(1690000000)));
+    EXPECT_EQ(summer.offset, std::chrono::hours(2));
+    EXPECT_TRUE(summer.daylightSaving);
+    (void)::unsetenv("TZ");
+    ::tzset();
+}
+
+TEST(WallClock, IsTheMachinesClock) {
+    const auto before = std::chrono::system_clock::now();
+    const Time now = WallClock().now();
+    EXPECT_GE(now, before);
+    EXPECT_LE(now, std::chrono::system_clock::now());
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,237 @@
+#include "host/SourceClock.h"
+
+#include "tests/doubles/ManualClock.h"
+#include "tests/doubles/SteppedQueue.h"
+
+#include <gtest/gtest.h>
+#include <rapidcheck.h>
+
+#include <limits>
+
+namespace pallax {
+namespace {
+
+using namespace std::chrono_literals;
+
+class SourceClockTest : public testing::Test {
+protected:
+    static Time at(std::chrono::nanoseconds sinceStart) {
+        return Time(std::chrono::seconds(1000)) + sinceStart;
+    }
+    /// Advances as a port does: step by step until the time is reached.
+    void reach(std::chrono::nanoseconds sinceStart) {
+        while (_clock.advance(at(sinceStart))) {
+        }
+    }
+    std::unique_ptr<RepeatingTimer> tick(std::chrono::nanoseconds interval) {
+        return _clock.scheduleRepeating(interval,
+                                        [this] { _ticks.push_back(_clock.now() - at(0s)); });
+    }
+
+    doubles::ManualClock _wall;
+    doubles::SteppedQueue _queue;
+    SourceClock _clock{_wall, _queue,
+                       [this] { return std::chrono::steady_clock::time_point(_queue.now()); }};
+    std::vector<std::chrono::nanoseconds> _ticks; // when, by the clock, since at(0)
+};
+
+using Ticks = std::vector<std::chrono::nanoseconds>;
+
+TEST_F(SourceClockTest, IsTheWallClockUntilASourceTimeIsHeard) {
+    EXPECT_EQ(_clock.now(), doubles::ManualClock::kStart);
+    reach(0s);
+    EXPECT_EQ(_clock.now(), at(0s));
+    reach(500ms);
+    EXPECT_EQ(_clock.now(), at(500ms));
+}
+
+TEST_F(SourceClockTest, TheZoneIsTheWallClocks) {
+    _wall.setZone({1h, true});
+    EXPECT_EQ(_clock.zone(at(0s)).offset, 1h);
+    EXPECT_TRUE(_clock.zone(at(0s)).daylightSaving);
+}
+
+TEST_F(SourceClockTest, TicksLieOnTheGridOfTheFirstSourceTime) {
+    const auto timer = tick(2s);
+    for (const auto time : {0ms, 1999ms, 2000ms, 3500ms, 4001ms, 6000ms}) {
+        reach(time);
+    }
+    EXPECT_EQ(_ticks, (Ticks{2s, 4s, 6s}));
+    EXPECT_EQ(_clock.now(), at(6s));
+}
+
+TEST_F(SourceClockTest, AGapGivesOneTickAndTheNextLiesOnTheGridAfterIt) {
+    const auto timer = tick(2s);
+    reach(0s);
+    reach(std::chrono::hours(24 * 365) + 1s);
+    EXPECT_EQ(_ticks, (Ticks{2s}));
+    reach(std::chrono::hours(24 * 365) + 2s);
+    EXPECT_EQ(_ticks, (Ticks{2s, std::chrono::hours(24 * 365) + 2s}));
+}
+
+TEST_F(SourceClockTest, AtATimeOfTheGridTheNextTickIsAWholeIntervalLater) {
+    const auto timer = tick(2s);
+    reach(0s);
+    reach(10s);
+    reach(11999ms);
+    EXPECT_EQ(_ticks, (Ticks{2s}));
+    reach(12s);
+    EXPECT_EQ(_ticks, (Ticks{2s, 12s}));
+}
+
+TEST_F(SourceClockTest, SeveralTimersTickInTheOrderOfTheirTimes) {
+    std::vector<int> order;
+    const auto slow = _clock.scheduleRepeating(3s, [&] { order.push_back(3); });
+    const auto quick = _clock.scheduleRepeating(2s, [&] { order.push_back(2); });
+    reach(0s);
+    reach(3500ms);
+    EXPECT_EQ(order, (std::vector<int>{2, 3}));
+}
+
+TEST_F(SourceClockTest, EachTickIsAStepOfItsOwn) {
+    const auto timer = tick(2s);
+    reach(0s);
+    EXPECT_TRUE(_clock.advance(at(2500ms)));
+    EXPECT_EQ(_clock.now(), at(2s));
+    EXPECT_FALSE(_clock.advance(at(2500ms)));
+    EXPECT_EQ(_clock.now(), at(2500ms));
+}
+
+TEST_F(SourceClockTest, ATimerScheduledLaterJoinsTheGrid) {
+    reach(0s);
+    reach(3s);
+    const auto timer = tick(2s);
+    reach(4s);
+    EXPECT_EQ(_ticks, (Ticks{4s}));
+}
+
+TEST_F(SourceClockTest, AStampThatStepsBackMovesNothing) {
+    const auto timer = tick(2s);
+    reach(0s);
+    reach(1500ms);
+    reach(1s);
+    EXPECT_EQ(_clock.now(), at(1500ms));
+    EXPECT_EQ(_ticks, Ticks{});
+}
+
+TEST_F(SourceClockTest, AnInvalidatedTimerTicksNoMore) {
+    const auto timer = tick(2s);
+    auto other = tick(2s);
+    reach(0s);
+    timer->invalidate();
+    other.reset();
+    reach(10s);
+    _queue.advance(10s);
+    EXPECT_EQ(_ticks, Ticks{});
+}
+
+TEST_F(SourceClockTest, ATimerMayEndItselfInItsAction) {
+    int ticks = 0;
+    std::unique_ptr<RepeatingTimer> timer;
+    timer = _clock.scheduleRepeating(2s, [&] {
+        ++ticks;
+        timer.reset();
+    });
+    reach(0s);
+    reach(20s);
+    EXPECT_EQ(ticks, 1);
+}
+
+TEST_F(SourceClockTest, ANewConnectionBeginsAGridOfItsOwn) {
+    const auto timer = tick(2s);
+    reach(100s);
+    _clock.sourceBegan();
+    reach(1s);
+    EXPECT_EQ(_clock.now(), at(1s));
+    reach(3s);
+    EXPECT_EQ(_ticks, (Ticks{3s}));
+}
+
+TEST_F(SourceClockTest, WithoutASourceTheTimersRunByTheWallClock) {
+    const auto timer = tick(2s);
+    _queue.advance(6s);
+    EXPECT_EQ(_ticks.size(), 3U);
+}
+
+TEST_F(SourceClockTest, WhileTheSourceIsHeardTheWallClockTicksNothing) {
+    const auto timer = tick(2s);
+    for (int step = 0; step < 20; ++step) {
+        reach(1ms * step); // a slow source
+        _queue.advance(500ms);
+    }
+    EXPECT_EQ(_ticks, Ticks{});
+}
+
+TEST_F(SourceClockTest, AfterTwoSecondsOfSilenceTheWallClockTakesOver) {
+    const auto timer = tick(2s); // by the wall clock at 2 s, 4 s, 6 s
+    _queue.advance(1s);
+    reach(0s);
+    _queue.advance(1999ms);
+    EXPECT_EQ(_ticks.size(), 0U);
+    _queue.advance(1001ms); // 4 s: silent for 3 s
+    EXPECT_EQ(_ticks, (Ticks{0s}));
+    reach(1s);
+    _queue.advance(1900ms);
+    EXPECT_EQ(_ticks.size(), 1U);
+}
+
+TEST_F(SourceClockTest, TellsTheEndOfTheSource) {
+    int ends = 0;
+    _clock.sourceEnded();
+    _clock.onEnd([&] { ++ends; });
+    _clock.sourceEnded();
+    EXPECT_EQ(ends, 1);
+}
+
+TEST_F(SourceClockTest, TimesAtTheEdgeOfTheRangeOverflowNothing) {
+    const auto timer = tick(2s);
+    const auto edge = [](std::int64_t count) { return Time(std::chrono::nanoseconds(count)); };
+    for (const std::int64_t count : {std::numeric_limits<std::int64_t>::min(), std::int64_t{0},
+                                     std::numeric_limits<std::int64_t>::max()}) {
+        while (_clock.advance(edge(count))) {
+        }
+    }
+    EXPECT_EQ(_clock.now(), edge(std::int64_t{1} << 62U));
+    EXPECT_EQ(_ticks.size(), 1U);
+}
+
+TEST(SourceClockProperty, TheSamePacketsGiveTheSameTicksWhateverClockFramesComeBetween) {
+    // A tick "sees" the packets before it; a tick without new packets shows nothing.
+    const auto seenBy = [](const std::vector<std::int64_t>& packets, bool withClockFrames) {
+        doubles::ManualClock wall;
+        doubles::SteppedQueue queue;
+        SourceClock clock(wall, queue, [] { return std::chrono::steady_clock::time_point(); });
+        std::vector<std::pair<std::int64_t, int>> seen; // tick time, packets so far
+        int count = 0;
+        int shown = 0;
+        const auto timer = clock.scheduleRepeating(2s, [&] {
+            if (count > shown) {
+                shown = count;
+                seen.emplace_back(clock.now().time_since_epoch().count(), count);
+            }
+        });
+        const auto reach = [&](std::int64_t time) {
+            while (clock.advance(Time(std::chrono::nanoseconds(time)))) {
+            }
+        };
+        std::int64_t now = 0;
+        for (const std::int64_t gap : packets) {
+            for (int step = 1; withClockFrames && count > 0 && step < 5; ++step) {
+                reach(now + gap * step / 5);
+            }
+            now += gap;
+            reach(now);
+            ++count;
+        }
+        reach(now + 2'000'000'000);
+        return seen;
+    };
+    EXPECT_TRUE(rc::check([&] {
+        const auto gaps = *rc::gen::container<std::vector<std::int64_t>>(
+            rc::gen::inRange<std::int64_t>(0, 9'000'000'000));
+        RC_ASSERT(seenBy(gaps, false) == seenBy(gaps, true));
+    }));
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,250 @@
+#include "telephony/PacketPlayer.h"
+
+#include "platform/PropertyList.h"
+#include "telephony/PacketSink.h"
+#include "tests/doubles/SteppedQueue.h"
+
+#include <gtest/gtest.h>
+
+namespace pallax {
+namespace {
+
+using namespace std::chrono_literals;
+
+constexpr std::chrono::seconds kFirst{1000}; // the first packet's stamp
+
+/// Packets with a log code and no more, stamped in milliseconds after kFirst.
+class ListSource final : public PacketSource {
+public:
+    struct Item {
+        std::chrono::milliseconds time;
+        std::uint8_t code;
+    };
+    explicit ListSource(std::vector<Item> items) : _items(std::move(items)) {}
+
+    std::string technology() const override { return "IFX"; }
+    Next next() override {
+        if (holdBackAt == _next) {
+            return {State::Later, std::nullopt};
+        }
+        if (_next == _items.size()) {
+            return {State::End, std::nullopt};
+        }
+        const Item& item = _items[_next++];
+        _data = {1, 0, 0, item.code, 0};
+        return {State::Packet, Packet{Time(kFirst + item.time), _data}};
+    }
+    void whenReady(std::function<void()> callback) override { ready = std::move(callback); }
+    bool restart() override {
+        _next = 0;
+        return canRestart;
+    }
+    std::string failure() const override { return broken; }
+
+    static constexpr std::size_t kNever = static_cast<std::size_t>(-1);
+    bool canRestart = true;
+    std::size_t holdBackAt = kNever; ///< the packet that has not come yet
+    std::string broken;
+    std::function<void()> ready;
+
+private:
+    std::vector<Item> _items;
+    std::size_t _next = 0;
+    ByteBuffer _data;
+};
+
+/// Writes a diary with the wall time in milliseconds: "500: packet 1 at 250".
+class DiarySink final : public PacketSink {
+public:
+    explicit DiarySink(doubles::SteppedQueue& queue) : _queue(queue) {}
+
+    void write(const FrameHeader& header, Bytes data) override {
+        _pending += kFrameHeaderSize + data.size();
+        const auto ms = [](std::chrono::nanoseconds time) {
+            return std::to_string(time.count() / 1'000'000);
+        };
+        std::string line = ms(_queue.now()) + ": ";
+        line += header.kind == FrameKind::Message ? "packet " + std::to_string(data[3])
+                : header.kind == FrameKind::Clock ? "clock"
+                                                  : "end";
+        if (header.sourceTime) {
+            line += " at " + ms(header.sourceTime->time_since_epoch() - kFirst);
+        }
+        diary.push_back(line);
+    }
+    std::size_t pending() const override { return _pending; }
+    void flush(std::function<void()> done) override {
+        _pending = 0;
+        ++flushes;
+        held = [this, done = std::move(done)] { _queue.async(done); };
+        if (!holds) {
+            held();
+        }
+    }
+
+    std::vector<std::string> diary;
+    bool holds = false; ///< the receiver takes nothing
+    int flushes = 0;
+    std::function<void()> held;
+
+private:
+    doubles::SteppedQueue& _queue;
+    std::size_t _pending = 0;
+};
+
+class PacketPlayerTest : public testing::Test {
+protected:
+    using Diary = std::vector<std::string>;
+
+    void play(std::vector<ListSource::Item> items, PlayOptions options = {}) {
+        _source.emplace(std::move(items));
+        _player.emplace(PacketPlayer::Setup{
+            _queue, *_source, _sink, options,
+            [this](const std::string& failure) { _ended.push_back(failure); },
+            [this] { return std::chrono::steady_clock::time_point(_queue.now()); }});
+        _player->play(everything());
+    }
+    static CodeFilter everything() {
+        return *CodeFilter::fromStartCommand({{"SetState", "Streaming"}}, true);
+    }
+    static PlayOptions at(double speed) { return {speed, false, 2s}; }
+
+    doubles::SteppedQueue _queue;
+    DiarySink _sink{_queue};
+    std::optional<ListSource> _source;
+    std::optional<PacketPlayer> _player;
+    std::vector<std::string> _ended;
+};
+
+TEST_F(PacketPlayerTest, KeepsTheSourcesTimingAndReachesTheTickAfterTheLastPacket) {
+    play({{0ms, 1}, {300ms, 2}});
+    _queue.advance(1100ms);
+    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0", "300: packet 2 at 300",
+                                  "800: clock at 800"}));
+    EXPECT_EQ(_ended.size(), 0U);
+    _queue.advance(900ms);
+    ASSERT_EQ(_sink.diary.size(), 8U);
+    EXPECT_EQ(
+        (Diary(_sink.diary.begin() + 4, _sink.diary.end())),
+        (Diary{"1300: clock at 1300", "1800: clock at 1800", "2000: clock at 2000", "2000: end"}));
+    EXPECT_EQ(_ended, (std::vector<std::string>{""}));
+}
+
+TEST_F(PacketPlayerTest, SpeedScalesTheWallTimeAndNotTheSourceTime) {
+    play({{0ms, 1}, {3000ms, 2}}, at(10));
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0", "300: packet 2 at 3000",
+                                  "400: clock at 4000", "400: end"}));
+}
+
+TEST_F(PacketPlayerTest, AtHalfSpeedTheClockRunsHalfAsFast) {
+    play({{0ms, 1}, {500ms, 2}}, at(0.5));
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0", "500: clock at 250",
+                                  "1000: packet 2 at 500"}));
+}
+
+TEST_F(PacketPlayerTest, AsFastAsTakenWaitsForNothing) {
+    play({{0ms, 1}, {3'000'000ms, 2}}, at(PlayOptions::kAsFastAsTaken));
+    _queue.runReady();
+    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0", "0: packet 2 at 3000000",
+                                  "0: clock at 3002000", "0: end"}));
+}
+
+TEST_F(PacketPlayerTest, TheTickAfterTheLastPacketLiesOnTheGridOfTheFirst) {
+    play({{0ms, 1}, {4000ms, 2}, {3900ms, 3}}, at(PlayOptions::kAsFastAsTaken));
+    _queue.runReady();
+    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0", "0: packet 2 at 4000",
+                                  "0: packet 3 at 3900", "0: clock at 6000", "0: end"}));
+}
+
+TEST_F(PacketPlayerTest, LaterRoundsBeginAtATickAndTimeGoesOn) {
+    PlayOptions options = at(PlayOptions::kAsFastAsTaken);
+    options.loop = true;
+    play({{0ms, 1}, {2500ms, 2}}, options);
+    for (int count = 0; count < 2; ++count) { // the first blocks play many rounds
+        _queue.step();
+    }
+    ASSERT_GE(_sink.diary.size(), 7U);
+    EXPECT_EQ(
+        (Diary(_sink.diary.begin(), _sink.diary.begin() + 7)),
+        (Diary{"0: clock at 0", "0: packet 1 at 0", "0: packet 2 at 2500", "0: packet 1 at 4000",
+               "0: packet 2 at 6500", "0: packet 1 at 8000", "0: packet 2 at 10500"}));
+}
+
+TEST_F(PacketPlayerTest, ALoopOverNothingEnds) {
+    PlayOptions options;
+    options.loop = true;
+    play({}, options);
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.diary, (Diary{"0: end"}));
+    EXPECT_EQ(_ended.size(), 1U);
+}
+
+TEST_F(PacketPlayerTest, ASourceThatCannotRestartIsPlayedOnce) {
+    PlayOptions options = at(PlayOptions::kAsFastAsTaken);
+    options.loop = true;
+    play({{0ms, 1}}, options);
+    _source->canRestart = false;
+    _queue.runReady();
+    EXPECT_EQ(_sink.diary.back(), "0: end");
+}
+
+TEST_F(PacketPlayerTest, AFailureEndsTheLoopAndIsTold) {
+    PlayOptions options = at(PlayOptions::kAsFastAsTaken);
+    options.loop = true;
+    play({{0ms, 1}}, options);
+    _source->broken = "r.pcap ends in the middle of a packet.";
+    _queue.runReady();
+    EXPECT_EQ(_ended, (std::vector<std::string>{"r.pcap ends in the middle of a packet."}));
+}
+
+TEST_F(PacketPlayerTest, ASlowReceiverStopsThePlayerAndNothingIsDropped) {
+    std::vector<ListSource::Item> items(3000, {0ms, 1});
+    _sink.holds = true;
+    play(items, at(PlayOptions::kAsFastAsTaken));
+    _queue.advance(10s);
+    EXPECT_EQ(_sink.flushes, 1); // one chunk is under way, and no more
+    EXPECT_LT(_sink.diary.size(), 2100U);
+    _sink.holds = false;
+    _sink.held();
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.diary.size(), items.size() + 3); // two clocks and the end
+}
+
+TEST_F(PacketPlayerTest, UnwantedPacketsAreLeftOutButTheFirstTimeIsTold) {
+    _source.emplace(std::vector<ListSource::Item>{{0ms, 1}, {100ms, 2}, {200ms, 3}});
+    _player.emplace(
+        PacketPlayer::Setup{_queue, *_source, _sink, at(PlayOptions::kAsFastAsTaken), {}, [this] {
+                                return std::chrono::steady_clock::time_point(_queue.now());
+                            }});
+    _player->play(*CodeFilter::fromStartCommand(
+        {{"SetState", "Streaming"}, {"SetZorellLogCodes", Array{PropertyList::integer(2)}}},
+        false));
+    _queue.runReady();
+    EXPECT_EQ(_sink.diary,
+              (Diary{"0: clock at 0", "0: packet 2 at 100", "0: clock at 2000", "0: end"}));
+}
+
+TEST_F(PacketPlayerTest, ASourceWithNothingYetIsWaitedFor) {
+    play({{0ms, 1}, {100ms, 2}});
+    _source->holdBackAt = 1;
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0"}));
+    ASSERT_TRUE(_source->ready);
+    _source->holdBackAt = ListSource::kNever;
+    _source->ready();
+    EXPECT_EQ(_sink.diary.back(), "1000: packet 2 at 100"); // late: at once
+}
+
+TEST_F(PacketPlayerTest, ADestroyedPlayerDoesNothingMore) {
+    play({{0ms, 1}, {100ms, 2}});
+    _queue.runReady();
+    _player.reset();
+    _queue.advance(10s);
+    EXPECT_EQ(_sink.diary.size(), 2U);
+    EXPECT_EQ(_ended.size(), 0U);
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,204 @@
+#include "telephony/TelephonyServer.h"
+
+#include "host/SourceClock.h"
+#include "host/WallClock.h"
+#include "telephony/RecordingSource.h"
+#include "telephony/SocketTelephonyService.h"
+#include "tests/telephony/ServiceFolder.h"
+
+#include <cerrno>
+
+namespace pallax {
+namespace {
+
+using namespace std::chrono_literals;
+
+/// The server runs on a queue of its own, as in another process; the client is the viewer's side.
+class TelephonyServerTest : public testing::Test {
+protected:
+    void start(std::string recording,
+               PlayOptions options = {PlayOptions::kAsFastAsTaken, false, 2s}) {
+        auto server = TelephonyServer::start(
+            {_other.queue, _serverPorts, std::string(kTelephonyControlPort),
+             [recording] { return RecordingSource::open(recording); }, options,
+             [this](const std::string& sentence) { _reports.push_back(sentence); }});
+        ASSERT_TRUE(server) << server.error().sentence;
+        _server = std::move(server).value();
+    }
+    void TearDown() override {
+        _other.end();
+        _server.reset();
+    }
+
+    /// What a viewer does up to the start command.
+    LogChannel openChannel() {
+        auto local = _ports.createLocal("viewer", [this](std::int32_t identifier, Bytes data) {
+            EXPECT_EQ(identifier, 0);
+            _codes.push_back(data[3]);
+            _times.push_back(_clock.now() - kRecordingStart);
+            return std::nullopt;
+        });
+        _local = std::move(local.port);
+        _local->setDispatchQueue(_queue);
+        SocketTelephonyService service(_ports);
+        const auto connection = service.connect([] {});
+        EXPECT_NE(connection, nullptr);
+        return connection->HXServerConnectionNetworkMonitorCreateLogChannel("viewer");
+    }
+    RemoteMessagePort::Outcome send(RemoteMessagePort& port, const Dictionary& command,
+                                    bool awaitReply) {
+        return port.sendRequest({0, *encodeMessage(command), 1s, 5s, awaitReply});
+    }
+    static Dictionary startCommand(int largestCode) {
+        Array codes;
+        for (int code = 1; code <= largestCode; ++code) {
+            codes.push_back(PropertyList::integer(code));
+        }
+        return {{"SetState", "Streaming"}, {"SetZorellLogCodes", codes}};
+    }
+
+    doubles::RuntimeFolder _folder;
+    std::vector<std::string> _reports;
+    OtherProcess _other;
+    SocketMessagePorts _serverPorts{_other.queue, openDirectory()};
+    std::unique_ptr<TelephonyServer> _server;
+
+    AsioMainQueue _queue;
+    WallClock _wall;
+    SourceClock _clock{_wall, _queue};
+    SocketMessagePorts _ports{_queue, openDirectory(), &_clock};
+    std::unique_ptr<LocalMessagePort> _local;
+    std::vector<int> _codes;
+    std::vector<std::chrono::nanoseconds> _times;
+};
+
+TEST_F(TelephonyServerTest, ServesARecordingFromTheStartCommandOn) {
+    start(recordLte(_folder, 30));
+    const LogChannel channel = openChannel();
+    ASSERT_EQ(channel.errorCode, 0);
+    EXPECT_EQ(channel.remotePortName, "com.norvane.telephony.LogChannel.1");
+    const auto remote = _ports.createRemote(*channel.remotePortName);
+    ASSERT_NE(remote, nullptr);
+    const auto reply = send(*remote, {{"GetTechnology", "GetTechnology"}}, true);
+    ASSERT_TRUE(reply.reply);
+    EXPECT_EQ(comparable(decodeMessage(*reply.reply)),
+              PropertyList(Dictionary{{"GetTechnology", "Zorell_LTE"}}));
+
+    bool ended = false;
+    std::vector<std::chrono::nanoseconds> ticks;
+    _clock.onEnd([&] { ended = true; });
+    const auto timer =
+        _clock.scheduleRepeating(2s, [&] { ticks.push_back(_clock.now() - kRecordingStart); });
+    EXPECT_EQ(_codes.size(), 0U); // nothing before the start command
+    EXPECT_EQ(send(*remote, startCommand(25), false).error, SendError::None);
+    ASSERT_TRUE(runUntil(_queue, [&] { return ended; }));
+    ASSERT_EQ(_codes.size(), 25U); // 26 to 30 were not asked for
+    for (int index = 0; index < 25; ++index) {
+        EXPECT_EQ(_codes[static_cast<std::size_t>(index)], index + 1);
+        EXPECT_EQ(_times[static_cast<std::size_t>(index)], index * 100ms);
+    }
+    EXPECT_EQ(ticks, (std::vector<std::chrono::nanoseconds>{2s, 4s}));
+}
+
+TEST_F(TelephonyServerTest, AChannelEndsWithItsClientAndItsSocketIsRemoved) {
+    start(recordLte(_folder, 30));
+    ASSERT_EQ(openChannel().errorCode, 0);
+    EXPECT_EQ(_folder.socketCount(), 3U); // control, channel, viewer
+    _local.reset();
+    EXPECT_TRUE(runUntil(_queue, [&] { return _folder.socketCount() == 1; }));
+}
+
+TEST_F(TelephonyServerTest, EveryChannelPlaysFromTheRecordingsStart) {
+    start(recordLte(_folder, 10));
+    for (int round = 1; round <= 2; ++round) {
+        _codes.clear();
+        const LogChannel channel = openChannel();
+        EXPECT_EQ(channel.remotePortName,
+                  "com.norvane.telephony.LogChannel." + std::to_string(round));
+        const auto remote = _ports.createRemote(*channel.remotePortName);
+        EXPECT_EQ(send(*remote, startCommand(10), false).error, SendError::None);
+        ASSERT_TRUE(runUntil(_queue, [&] { return _codes.size() == 10; }));
+        EXPECT_EQ(_codes.front(), 1);
+        _local.reset();
+    }
+}
+
+TEST_F(TelephonyServerTest, TheServersEndInvalidatesTheClientsPorts) {
+    start(recordLte(_folder, 1));
+    const LogChannel channel = openChannel();
+    const auto remote = _ports.createRemote(*channel.remotePortName);
+    _other.end();
+    _server.reset();
+    EXPECT_TRUE(runUntil(_queue, [&] { return !remote->isValid(); }));
+    EXPECT_EQ(_folder.socketCount(), 1U); // the viewer's own
+}
+
+TEST_F(TelephonyServerTest, ANameThatIsTakenIsAClearFailure) {
+    start(recordLte(_folder, 1));
+    SocketMessagePorts ports(_queue, openDirectory());
+    const auto second =
+        TelephonyServer::start({_queue, ports, std::string(kTelephonyControlPort), {}, {}, {}});
+    ASSERT_FALSE(second);
+    EXPECT_EQ(second.error().sentence,
+              "A telephony service named com.norvane.telephony is already running.");
+}
+
+TEST_F(TelephonyServerTest, AReceiverThatDoesNotExistIsAnError) {
+    start(recordLte(_folder, 1));
+    SocketTelephonyService service(_ports);
+    const auto connection = service.connect({});
+    const LogChannel channel =
+        connection->HXServerConnectionNetworkMonitorCreateLogChannel("nobody");
+    EXPECT_EQ(channel.errorDomain, kServiceErrorDomain);
+    EXPECT_EQ(channel.errorCode, ECONNREFUSED);
+    EXPECT_EQ(channel.remotePortName, std::nullopt);
+}
+
+TEST_F(TelephonyServerTest, ARecordingThatHasGoneIsAnErrorAndReported) {
+    start(recordLte(_folder, 1));
+    ASSERT_EQ(::unlink(_folder.file("lte.pcap").c_str()), 0);
+    const LogChannel channel = openChannel();
+    EXPECT_EQ(channel.errorCode, EIO);
+    _other.end();
+    EXPECT_EQ(_reports,
+              (std::vector<std::string>{_folder.file("lte.pcap") +
+                                        " cannot be opened: No such file or directory."}));
+}
+
+TEST_F(TelephonyServerTest, WhatIsNoRequestIsAnsweredWithAnErrorOrNotAtAll) {
+    start(recordLte(_folder, 1));
+    const auto control = _ports.createRemote(kTelephonyControlPort);
+    const auto refused = control->sendRequest({0, ByteBuffer{'?'}, 1s, 5s, true});
+    EXPECT_EQ(comparable(decodeMessage(*refused.reply)),
+              PropertyList(Dictionary{{"ErrorDomain", PropertyList::integer(1)},
+                                      {"ErrorCode", PropertyList::integer(EINVAL)}}));
+    const LogChannel channel = openChannel();
+    const auto remote = _ports.createRemote(*channel.remotePortName);
+    for (const Dictionary& request :
+         {Dictionary{{"GetTechnology", "?"}}, Dictionary{{"SetState", "Idle"}}, Dictionary{}}) {
+        const auto outcome = send(*remote, request, true);
+        EXPECT_EQ(outcome.error, SendError::None);
+        EXPECT_EQ(outcome.reply, std::nullopt);
+    }
+    EXPECT_EQ(_codes.size(), 0U);
+}
+
+TEST_F(TelephonyServerTest, WithoutAServiceThereIsNoConnection) {
+    SocketTelephonyService service(_ports);
+    EXPECT_EQ(service.connect({}), nullptr);
+}
+
+TEST_F(TelephonyServerTest, AnUnexpectedAnswerOfTheServiceIsAnError) {
+    auto local = _serverPorts.createLocal(kTelephonyControlPort,
+                                          [](std::int32_t, Bytes) { return ByteBuffer{'?'}; });
+    local.port->setDispatchQueue(_other.queue);
+    SocketTelephonyService service(_ports);
+    const auto connection = service.connect({});
+    const LogChannel channel =
+        connection->HXServerConnectionNetworkMonitorCreateLogChannel("viewer");
+    EXPECT_EQ(channel.errorCode, EPROTO);
+    _other.end();
+}
+
+} // namespace
+} // namespace pallax
