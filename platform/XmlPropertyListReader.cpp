@@ -266,8 +266,9 @@ PropertyList readXml(Bytes bytes) {
     checkXmlMarkup(text);
     const std::size_t start = text.starts_with(kUtf8Mark) ? kUtf8Mark.size() : 0;
     pugi::xml_document document;
+    // With the terminating null, which the parser would else put in place of the last byte.
     const pugi::xml_parse_result parsed = document.load_buffer_inplace(
-        text.data() + start, text.size() - start, kParsing, pugi::encoding_utf8);
+        text.data() + start, text.size() - start + 1, kParsing, pugi::encoding_utf8);
     if (!parsed) {
         refuse(start + static_cast<std::size_t>(std::max<std::ptrdiff_t>(parsed.offset, 0)),
                std::string("malformed XML: ") + parsed.description());

@@ -1,9 +1,9 @@
 #include "LogGenerator/LogGenerator.h"
 
-#include "tests/doubles/FakeBundle.h"
+#include "LogGenerator/Records/Exceptions.h"
+
 #include "tests/doubles/FakeGenerator.h"
-#include "tests/doubles/FakeResources.h"
-#include "tests/doubles/ManualClock.h"
+#include "tests/doubles/GeneratorFixture.h"
 #include "tests/doubles/RecordingLog.h"
 
 #include <gtest/gtest.h>
@@ -27,10 +27,9 @@ protected:
     Array history() const { return *state.find("History")->array(); }
     Dictionary newestEntry() const { return *history().back().dictionary(); }
 
-    doubles::ManualClock clock;
-    doubles::FakeResources resources;
-    doubles::FakeBundle bundle;
-    GeneratorEnvironment environment{clock, resources, bundle};
+    doubles::GeneratorFixture fixture;
+    doubles::ManualClock& clock = fixture.clock;
+    GeneratorEnvironment environment = fixture.environment();
     Dictionary state;
 };
 

@@ -62,11 +62,12 @@ inline std::size_t depthOf(PropertyList object) {
     return depth;
 }
 
-/// A binary property list of exactly the objects given: two bytes for an offset, one for a reference.
+/// A binary property list of exactly the objects given, with offsets of two bytes.
 class BinaryFile {
 public:
     /// Each object's bytes, its marker first.
-    explicit BinaryFile(const std::vector<ByteBuffer>& objects) : _bytes(bytesOf("bplist00")) {
+    explicit BinaryFile(const std::vector<ByteBuffer>& objects, std::uint8_t referenceWidth = 1)
+        : _bytes(bytesOf("bplist00")) {
         std::vector<std::size_t> offsets;
         for (const ByteBuffer& object : objects) {
             offsets.push_back(_bytes.size());
@@ -78,7 +79,7 @@ public:
         }
         number(0, 6);
         number(2, 1);
-        number(1, 1);
+        number(referenceWidth, 1);
         number(offsets.size(), 8);
         number(0, 8);
         number(table, 8);

@@ -27,9 +27,8 @@ TEST(XmlPropertyListWriter, WritesOneElementALine) {
     const PropertyList list = Dictionary{
         {"string", "a"},
         {"<key>", DisplayNumber(std::int64_t{-80}, kDbm)},
-        {"list",
-         Array{PropertyList::integer(-5), PropertyList::boolean(true),
-               PropertyList::boolean(false), Array{}, Dictionary{}}},
+        {"list", Array{PropertyList::integer(-5), PropertyList::boolean(true),
+                       PropertyList::boolean(false), Array{}, Dictionary{}}},
         {"data", PropertyList::data({0x0F, 0xBD, 0x77, 0x00})},
         {"date", Date(std::chrono::seconds(1700000000))},
         {"real", PropertyList::real(0.1)},
@@ -111,7 +110,7 @@ TEST(XmlPropertyListWriter, RefusesAnOutputLargerThan64Mebibytes) {
         shared = Array{shared, shared};
     }
     EXPECT_EQ(written(shared), "at byte 0: a property list larger than 64 MiB");
-    EXPECT_EQ(written(std::string(kLargestPropertyList, 'x')),
+    EXPECT_EQ(written(PropertyList::data(ByteBuffer(std::size_t{50} << 20U))),
               "at byte 0: a property list larger than 64 MiB");
 }
 

@@ -36,5 +36,23 @@ TEST(ZOR_GSMClassIndex, ItsEndIsPrintedBeforeThatOfItsBase) {
               (std::vector<std::string>{"Deallocing ZOR_GSMClassIndex", "Deallocing ClassIndex"}));
 }
 
+TEST(ZOR_GSMClassIndex, SubscribersOfTheUMTSCodesInCallOrder) {
+    FakeStandardOutput output;
+    const ZOR_GSMClassIndex index(output);
+    using Names = std::vector<std::string>;
+    EXPECT_EQ(subscribersOf(index, 0x4005), (Names{"GSM Set", "UMTS Set"}));
+    for (const LogCode code : {0x4031U, 0x4125U, 0x4127U, 0x4157U}) {
+        EXPECT_EQ(subscribersOf(index, code), (Names{"UMTS RR Info"}));
+    }
+    EXPECT_EQ(subscribersOf(index, 0x4116), (Names{"BLER"}));
+    EXPECT_EQ(subscribersOf(index, 0x417A),
+              (Names{"Active Set", "Detected Set", "Monitored Set", "Virtual Active Set"}));
+    EXPECT_EQ(subscribersOf(index, 0x4221), (Names{"HSDPA Info"}));
+    const Names ofCellMonitor = subscribersOf(index, 0xFF0001);
+    ASSERT_GE(ofCellMonitor.size(), 2U);
+    EXPECT_EQ(Names(ofCellMonitor.end() - 2, ofCellMonitor.end()),
+              (Names{"UMTS Set", "UMTS RR Info"}));
+}
+
 } // namespace
 } // namespace pallax

@@ -1,0 +1,34 @@
+#pragma once
+
+#include "LogGenerator/Records/Base.h"
+
+namespace pallax {
+
+/// The HARQ statistics of the high-speed downlink, section "HSDPA Info". A packet without
+/// processes of a kind leaves the list of that kind as it was.
+///
+///   0x4221, at least 18 bytes, little-endian
+///   byte             bit  width   key           shown as
+///   13               0    8       Version       number
+///   14               0    10      Sub Frames    number
+///   15               2    2       Carrier Info  label (kCarriers)
+///   16               0    8                     primary process count p
+///   17               0    8                     secondary process count s
+///   18 + 9i               9 byte                process i of "Primary HARQ Process"
+///   18 + 162p + 9i        9 byte                process i of "Secondary HARQ Process": 162 bytes
+///                                               behind 18 for each primary process, not 9
+///
+///   process
+///   byte  width  key           shown as
+///   0     8      Process ID    number
+///   1     32     No Rx Bits    number
+///   5     16     New Tx        number
+///   7     16     Block Errors  number
+class HSDPAInformation final : public Base {
+public:
+    std::string_view getSectionName() const override { return "HSDPA Info"; }
+    std::span<const LogCode> getLogCodeArray() const override;
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
+};
+
+} // namespace pallax

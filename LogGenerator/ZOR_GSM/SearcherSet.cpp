@@ -1,0 +1,44 @@
+#include "LogGenerator/ZOR_GSM/SearcherSet.h"
+
+#include "platform/SystemLog.h"
+
+#include <array>
+
+namespace pallax {
+
+namespace {
+
+constexpr LogCode kSearcherLogCode = 0x417A;
+constexpr auto kLogCodes = std::to_array<LogCode>({kSearcherLogCode});
+constexpr std::size_t kMinimumLength = 16;
+constexpr std::size_t kCellCountOffset = 15;
+
+} // namespace
+
+std::span<const LogCode> SearcherSet::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+Array SearcherSet::cellsOf(const LogRecord& /*record*/) const {
+    return {};
+}
+
+std::size_t SearcherSet::cellCount(const LogRecord& record) {
+    return record.u8(kCellCountOffset);
+}
+
+void SearcherSet::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Warning, "%s", _logLine);
+    if (logCode != kSearcherLogCode) {
+        return logUnknown(logCode);
+    }
+    if (!record.has(kMinimumLength)) {
+        return;
+    }
+    clearList();
+    if (cellCount(record) != 0) {
+        replaceList(cellsOf(record));
+    }
+}
+
+} // namespace pallax

@@ -1,0 +1,166 @@
+#include "LogGenerator/ZOR_GSM/UMTSRRInfo.h"
+
+#include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/EntryList.h"
+#include "platform/SystemLog.h"
+#include "platform/TelephonyConstants.h"
+
+#include <array>
+#include <limits>
+
+namespace pallax {
+
+namespace {
+
+constexpr LogCode kStateLogCode = 0x4125;
+constexpr LogCode kTransmitPowerLogCode = 0x4031;
+constexpr LogCode kIdentityLogCode = 0x4127;
+constexpr LogCode kCipheringLogCode = 0x4157;
+constexpr auto kLogCodes =
+    std::to_array<LogCode>({kStateLogCode, kTransmitPowerLogCode, kIdentityLogCode,
+                            kCipheringLogCode, kCellMonitorLogCode});
+
+constexpr std::size_t kStateRecordLength = 14;
+constexpr std::size_t kTransmitPowerRecordLength = 16;
+constexpr std::size_t kIdentityRecordLength = 29;
+constexpr std::size_t kCipheringRecordLength = 19;
+
+constexpr auto kRRCStates = std::to_array<std::string_view>({
+    "Disconnected",
+    "Connecting",
+    "CELL_FACH",
+    "CELL_DCH",
+    "CELL_PCH",
+    "URA_PCH",
+});
+static_assert(kRRCStates.size() == 6);
+
+constexpr auto kStateFields = std::to_array<Field>({
+    {"RRC State", u8At(13), Conversion::label(kRRCStates)},
+});
+
+constexpr std::string_view kCellIdKey = "Cell ID";
+constexpr std::string_view kUarfcnKey = "UARFCN";
+
+constexpr auto kIdentityFields = std::to_array<Field>({
+    {kCellIdKey, s32At(21), Conversion::number()},
+    {"Downlink Frequency", s32At(17), Conversion::number()},
+    {"Uplink Frequency", s32At(13), Conversion::number()},
+});
+constexpr auto kRegistrationAreaFields = std::to_array<Field>({
+    {"URA ID", u16At(25), Conversion::number()},
+});
+
+constexpr auto kCipheringFields = std::to_array<Field>({
+    {"Ciphering", u8At(13), Conversion::flag("Enabled", "Disabled")},
+});
+
+constexpr NumberFormat kMeanDbm{"%4.2lf dBm"};
+constexpr std::size_t kPowerCountOffset = 14;
+constexpr EntryList::Layout kPowerEntries{16, 14, 6};
+constexpr std::size_t kRawPowerOffset = 4;
+
+/// Of a raw transmit power, in whole dBm.
+int transmitPower_dbm(std::int16_t raw) {
+    constexpr int kRawOffset = 512;
+    constexpr int kStepsPerDb = 10;
+    constexpr int kOffset_db = 70;
+    return (raw + kRawOffset) / kStepsPerDb - kOffset_db;
+}
+
+/// Over the entries that carry a power; not a number when none does.
+double meanTransmitPower_dbm(const EntryList& entries) {
+    int sum_dbm = 0;
+    int counted = 0;
+    for (std::size_t index = 0; index < entries.wholeCount(); ++index) {
+        const std::int16_t raw = entries.at(index).s16(kRawPowerOffset);
+        if (raw != 0) {
+            sum_dbm += transmitPower_dbm(raw);
+            ++counted;
+        }
+    }
+    return counted != 0 ? static_cast<double>(sum_dbm) / counted
+                        : std::numeric_limits<double>::quiet_NaN();
+}
+
+/// A number that the cell monitor reports, and what is logged without it.
+struct CellKey {
+    std::string_view constant;
+    std::string_view key;
+    std::string_view failure;
+};
+constexpr auto kCellKeys = std::to_array<CellKey>({
+    {kHXCellMonitorCellId, kCellIdKey, "UMTSRRInfo: Failed to retrieve Cell ID\n"},
+    {kHXCellMonitorUARFCN, kUarfcnKey, "UMTSRRInfo: Failed to retrieve UARFCN\n"},
+    {kHXCellMonitorSCN, "Scrambling Code", "UMTSRRInfo: Failed to retrieve Scrambling Code\n"},
+});
+
+} // namespace
+
+std::span<const LogCode> UMTSRRInfo::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+void UMTSRRInfo::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Warning, "UMTSRRInfo");
+    switch (logCode) {
+    case kStateLogCode:
+        return updateState(record);
+    case kIdentityLogCode:
+        return updateIdentity(record);
+    case kCipheringLogCode:
+        return updateCiphering(record);
+    case kTransmitPowerLogCode:
+        return updateTransmitPower(record);
+    case kCellMonitorLogCode:
+        return updateFromCellMonitor(record);
+    default:
+        return logUnknown(logCode);
+    }
+}
+
+void UMTSRRInfo::updateState(const LogRecord& record) {
+    if (record.has(kStateRecordLength)) {
+        show(kStateFields, record);
+    }
+}
+
+void UMTSRRInfo::updateIdentity(const LogRecord& record) {
+    if (record.has(kIdentityRecordLength)) {
+        show(kIdentityFields, record);
+        removeKey(kUarfcnKey); // the cell monitor's, of the cell before
+        show(kRegistrationAreaFields, record);
+    }
+}
+
+void UMTSRRInfo::updateCiphering(const LogRecord& record) {
+    if (record.has(kCipheringRecordLength)) {
+        show(kCipheringFields, record);
+    }
+}
+
+void UMTSRRInfo::updateTransmitPower(const LogRecord& record) {
+    if (record.has(kTransmitPowerRecordLength)) {
+        const EntryList entries(record, kPowerEntries, record.u8(kPowerCountOffset));
+        show("Transmit Power", DisplayNumber(meanTransmitPower_dbm(entries), kMeanDbm));
+    }
+}
+
+void UMTSRRInfo::updateFromCellMonitor(const LogRecord& record) {
+    const auto cells = readCellMonitorArray(record);
+    if (!cells) {
+        return logNoCellArray();
+    }
+    const PropertyList* cell =
+        findCell(*cells, kHXCellMonitorRadioAccessTechnologyUMTS, kHXCellMonitorCellTypeServing);
+    if (cell == nullptr) {
+        return;
+    }
+    for (const CellKey& cellKey : kCellKeys) {
+        if (const auto number = cellNumber(*cell, cellKey.constant, cellKey.failure)) {
+            show(cellKey.key, DisplayNumber(std::int64_t{*number}, kDecimal));
+        }
+    }
+}
+
+} // namespace pallax

@@ -1,0 +1,106 @@
+#include "LogGenerator/ZOR_GSM/UMTSSet.h"
+
+#include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/EntryList.h"
+#include "LogGenerator/ZOR_GSM/RankingRecord.h"
+#include "platform/SystemLog.h"
+#include "platform/TelephonyConstants.h"
+
+#include <array>
+
+namespace pallax {
+
+namespace {
+
+constexpr auto kLogCodes = std::to_array<LogCode>({kRankingLogCode, kCellMonitorLogCode});
+
+constexpr std::size_t kCountOffset = 13;
+constexpr std::size_t kEntryLength = 10;
+
+constexpr NumberFormat kRealDb{"%f dB"};
+constexpr double kRscpOffset_db = -21.0;
+constexpr double kEnergyStep_db = 0.5;
+
+constexpr std::string_view kScramblingCodeKey = "Scrambling Code";
+constexpr std::string_view kRscpKey = "RSCP";
+constexpr std::string_view kEnergyKey = "Energy Per Chip";
+
+constexpr auto kEntryFields = std::to_array<Field>({
+    {kScramblingCodeKey, u16At(2), Conversion::number()},
+    {kRscpKey, s8At(4), Conversion::number(kDecimalDb, 1.0, kRscpOffset_db)},
+    {kEnergyKey, s8At(7), Conversion::number(kRealDb, kEnergyStep_db)},
+    {"Downlink Frequency", s16At(0), Conversion::number()},
+    {"Ranking Value", s16At(8), Conversion::number()},
+    {"Rank Cell RSCP", s16At(5), Conversion::number(kDecimalDb)},
+});
+
+/// What the cell monitor says of one neighbour; a key whose number is missing is left out.
+Dictionary neighbourOf(const PropertyList& cell) {
+    Dictionary neighbour;
+    if (const auto uarfcn =
+            cellNumber(cell, kHXCellMonitorUARFCN, "UMTSSet: Failed to retrieve UARFCN\n")) {
+        neighbour.setFixed("UARFCN", DisplayNumber(std::int64_t{*uarfcn}, kDecimal));
+    }
+    if (const auto code =
+            cellNumber(cell, kHXCellMonitorSCN, "UMTSSet: Failed to retrieve Scrambling Code\n")) {
+        neighbour.setFixed(kScramblingCodeKey, DisplayNumber(std::int64_t{*code}, kDecimal));
+    }
+    if (const auto rscp =
+            cellNumber(cell, kHXCellMonitorRSCP, "UMTSSet: Failed to retrieve RSCP\n")) {
+        neighbour.setFixed(kRscpKey, cellLevel(*rscp, kDecimalDbm));
+    }
+    if (const auto energy =
+            cellNumber(cell, kHXCellMonitorECN0, "UMTSSet: Failed to retrieve Energy Per Chip\n")) {
+        neighbour.setFixed(kEnergyKey, cellLevel(*energy, kDecimalDb));
+    }
+    return neighbour;
+}
+
+} // namespace
+
+std::span<const LogCode> UMTSSet::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+void UMTSSet::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Warning, "UMTSSet");
+    switch (logCode) {
+    case kRankingLogCode:
+        return updateFromRanking(record);
+    case kCellMonitorLogCode:
+        return updateFromCellMonitor(record);
+    default:
+        return logUnknown(logCode);
+    }
+}
+
+void UMTSSet::updateFromRanking(const LogRecord& record) {
+    if (!record.has(kRankingRecordLength)) {
+        return;
+    }
+    clearList();
+    const EntryList entries(record, {kRankingEntriesStart, kEntryLength, kEntryLength},
+                            record.u8(kCountOffset));
+    if (entries.count() != 0) {
+        replaceList(entries.map([](const LogRecord& entry, std::size_t /*index*/) {
+            return entryOf(kEntryFields, entry);
+        }));
+    }
+}
+
+void UMTSSet::updateFromCellMonitor(const LogRecord& record) {
+    const auto cells = readCellMonitorArray(record);
+    clearList(); // also when nothing could be read
+    if (!cells) {
+        return logNoCellArray();
+    }
+    Array neighbours;
+    for (const PropertyList& cell : *cells) {
+        if (isCell(cell, kHXCellMonitorRadioAccessTechnologyUMTS, kHXCellMonitorCellTypeNeighbor)) {
+            neighbours.emplace_back(neighbourOf(cell));
+        }
+    }
+    replaceList(std::move(neighbours));
+}
+
+} // namespace pallax

@@ -1,0 +1,42 @@
+#pragma once
+
+#include "LogGenerator/Records/Base.h"
+
+namespace pallax {
+
+/// The UMTS neighbour cells, section "UMTS Set": those that the phone ranks for reselection, or
+/// those of the cell monitor, whichever came last. The two have different keys and units.
+///
+///   0x4005, at least 15 bytes, little-endian
+///   byte      width    field
+///   13        8        entry count
+///   15 + 10i  10 byte  entry i; the GSM entries of the record start at 15 as well
+///
+///   entry
+///   byte  width  key                 shown as
+///   2     16     Scrambling Code     number
+///   4     8      RSCP                signed - 21, dB
+///   7     8      Energy Per Chip     signed x 0.5, six decimals, dB
+///   0     16     Downlink Frequency  signed
+///   8     16     Ranking Value       signed
+///   5     16     Rank Cell RSCP      signed, dB
+///
+///   0xFF0001, the cell-monitor array: every UMTS neighbour
+///   constant              key              shown as
+///   kHXCellMonitorUARFCN  UARFCN           number
+///   kHXCellMonitorSCN     Scrambling Code  number
+///   kHXCellMonitorRSCP    RSCP             low 16 bits, signed, dBm; empty for 32767
+///   kHXCellMonitorECN0    Energy Per Chip  low 16 bits, signed, dB; empty for 32767
+class UMTSSet final : public Base {
+public:
+    std::string_view getSectionName() const override { return "UMTS Set"; }
+    std::span<const LogCode> getLogCodeArray() const override;
+    SectionKind sectionKind() const override { return SectionKind::List; }
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
+
+private:
+    void updateFromRanking(const LogRecord& record);
+    void updateFromCellMonitor(const LogRecord& record);
+};
+
+} // namespace pallax

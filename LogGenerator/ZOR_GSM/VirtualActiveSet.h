@@ -1,0 +1,19 @@
+#pragma once
+
+#include "LogGenerator/ZOR_GSM/SearcherSet.h"
+
+namespace pallax {
+
+/// The active set on a frequency that the phone is not on, section "Virtual Active Set". The
+/// searcher's cell list empties it and shows nothing in it, whatever set types its cells have.
+///
+///   0x417A, at least 16 bytes
+///   byte  width  field
+///   15    8      cell count; no cell is shown
+class VirtualActiveSet final : public SearcherSet {
+public:
+    VirtualActiveSet();
+    std::string_view getSectionName() const override;
+};
+
+} // namespace pallax

@@ -1,0 +1,17 @@
+#include "LogGenerator/ZOR_GSM/MonitoredSet.h"
+
+#include "tests/LogGenerator/ZOR_GSM/SearcherRecords.h"
+
+namespace pallax {
+namespace {
+
+TEST(MonitoredSet, SubscribesToTheCellListIgnoresShortAndUnknownPacketsAndIsEmptiedByNoCells) {
+    doubles::expectSearcherSet<MonitoredSet>("Monitored Set", "MonitoredSet");
+}
+
+TEST(MonitoredSet, IsAlwaysEmptiedWhateverTheCells) {
+    doubles::expectAlwaysEmptied<MonitoredSet>();
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,148 @@
+#include "LogGenerator/ZOR_GSM/UMTSRRInfo.h"
+#include "tests/doubles/PropertyListRecord.h"
+#include "tests/doubles/RecordFixture.h"
+#include "tests/doubles/RecordProperties.h"
+
+#include <gtest/gtest.h>
+
+namespace pallax {
+namespace {
+
+using namespace doubles; // NOLINT: the vocabulary of these tests
+using Lines = std::vector<RecordingLog::Line>;
+
+constexpr LogCode kCellMonitor = 0xFF0001;
+
+PropertyList number(std::int64_t value) {
+    return PropertyList::integer(value);
+}
+
+Dictionary serving(std::int64_t cellId, std::int64_t uarfcn, std::int64_t code) {
+    return {{"kHXCellMonitorSCN", number(code)},
+            {"kHXCellMonitorUARFCN", number(uarfcn)},
+            {"kHXCellMonitorCellId", number(cellId)},
+            {"kHXCellMonitorCellType", "kHXCellMonitorCellTypeServing"},
+            {"kHXCellMonitorCellRadioAccessTechnology", "kHXCellMonitorRadioAccessTechnologyUMTS"}};
+}
+
+Dictionary with(Dictionary cell, const char* key, PropertyList value) {
+    cell.set(key, std::move(value));
+    return cell;
+}
+
+Record monitored(const PropertyList& root) {
+    return propertyListRecord(kCellMonitor, root);
+}
+
+TEST(UMTSRRInfoCellMonitor, ShowsTheFirstUMTSServingCellWithItsKeysInOrder) {
+    const Dictionary neighbour =
+        with(serving(1, 2, 3), "kHXCellMonitorCellType", "kHXCellMonitorCellTypeNeighbor");
+    const Dictionary gsm = with(serving(4, 5, 6), "kHXCellMonitorCellRadioAccessTechnology",
+                                "kHXCellMonitorRadioAccessTechnologyGSM");
+    RecordFixture<UMTSRRInfo> fixture;
+    fixture.feed(monitored(
+        Array{neighbour, "no cell", gsm, serving(123456789, 10713, 388), serving(7, 8, 9)}));
+    EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"}}));
+    expectInOrder(
+        fixture.section(),
+        Dictionary{{"Cell ID", "123456789"}, {"UARFCN", "10713"}, {"Scrambling Code", "388"}});
+    EXPECT_EQ(fixture.keys().find("UARFCN")->displayNumber()->integer(), 10713);
+}
+
+TEST(UMTSRRInfoCellMonitor, NumbersAreSigned32BitIntegers) {
+    RecordFixture<UMTSRRInfo> fixture;
+    fixture.feed(monitored(Array{serving(-2147483648, 2147483647, 32767)}));
+    expectInOrder(fixture.section(), Dictionary{{"Cell ID", "-2147483648"},
+                                                {"UARFCN", "2147483647"},
+                                                {"Scrambling Code", "32767"}});
+}
+
+TEST(UMTSRRInfoCellMonitor, AMissingNumberIsLoggedAndLeavesItsKeyAsItWas) {
+    const std::vector<std::array<const char*, 3>> numbers = {
+        {"kHXCellMonitorCellId", "Cell ID", "UMTSRRInfo: Failed to retrieve Cell ID\n"},
+        {"kHXCellMonitorUARFCN", "UARFCN", "UMTSRRInfo: Failed to retrieve UARFCN\n"},
+        {"kHXCellMonitorSCN", "Scrambling Code",
+         "UMTSRRInfo: Failed to retrieve Scrambling Code\n"},
+    };
+    for (const auto& [constant, key, line] : numbers) {
+        RecordFixture<UMTSRRInfo> fixture;
+        fixture.feed(monitored(Array{serving(1, 1, 1)}));
+        Dictionary cell = serving(2, 2, 2);
+        cell.remove(constant);
+        fixture.feed(monitored(Array{cell}));
+        EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"}, {3, line}}));
+        for (const char* each : {"Cell ID", "UARFCN", "Scrambling Code"}) {
+            EXPECT_EQ(fixture.text(each), std::string_view(each) == key ? "1" : "2");
+        }
+    }
+}
+
+TEST(UMTSRRInfoCellMonitor, ANumberThatIsNo32BitIntegerCountsAsMissing) {
+    Dictionary cell = serving(std::int64_t{1} << 31U, 0, 0);
+    cell.set("kHXCellMonitorUARFCN", "10713");
+    cell.set("kHXCellMonitorSCN", PropertyList::real(0.5));
+    RecordFixture<UMTSRRInfo> fixture;
+    fixture.feed(monitored(Array{cell, serving(1, 2, 3)}));
+    EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"},
+                                    {3, "UMTSRRInfo: Failed to retrieve Cell ID\n"},
+                                    {3, "UMTSRRInfo: Failed to retrieve UARFCN\n"},
+                                    {3, "UMTSRRInfo: Failed to retrieve Scrambling Code\n"}}));
+    EXPECT_TRUE(fixture.keys().empty()) << "the second serving cell is not looked at";
+}
+
+TEST(UMTSRRInfoCellMonitor, ABrokenPropertyListLogsTwoLinesAndChangesNothing) {
+    // The text form, of which no beginning is a property list of its own.
+    constexpr std::string_view kCells = "( { kHXCellMonitorCellId = 1; } )";
+    const ByteBuffer whole = propertyListRecord(kCellMonitor, kCells).bytes();
+    RecordFixture<UMTSRRInfo> fixture;
+    fixture.feed(monitored(Array{serving(7, 8, 9)}));
+    const PropertyList before = fixture.snapshot();
+    for (std::size_t length = 0; length < whole.size(); ++length) {
+        fixture.feed(ByteBuffer(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(length)),
+                     kCellMonitor);
+        EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"},
+                                        {3, "Cell Info Array data could not be constructed"},
+                                        {3, "Failed to get Cell Array\n"}}))
+            << "cut at " << length;
+        EXPECT_EQ(fixture.section(), before);
+    }
+}
+
+TEST(UMTSRRInfoCellMonitor, NoElementsAndNoUMTSServingCellChangeNothingSilently) {
+    const Dictionary neighbour =
+        with(serving(1, 2, 3), "kHXCellMonitorCellType", "kHXCellMonitorCellTypeNeighbor");
+    RecordFixture<UMTSRRInfo> fixture;
+    for (const PropertyList& root :
+         {PropertyList(Array()), PropertyList(Array{neighbour}), PropertyList(serving(1, 2, 3))}) {
+        fixture.feed(monitored(root));
+        EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"}}));
+        EXPECT_TRUE(fixture.keys().empty());
+    }
+}
+
+TEST(UMTSRRInfoCellMonitor, TheUARFCNIsShownOnlyUntilTheNext0x4127) {
+    const Record identity = Record(0x4127).s32(9763).s32(10713).s32(42).u16(7).padTo(29);
+    RecordFixture<UMTSRRInfo> fixture;
+    fixture.feed(monitored(Array{serving(41, 10713, 388)}));
+    fixture.feed(ByteBuffer(identity.bytes().begin(), identity.bytes().end() - 1));
+    EXPECT_EQ(fixture.text("UARFCN"), "10713") << "a short 0x4127 removes nothing";
+    fixture.feed(identity);
+    expectInOrder(fixture.section(), Dictionary{{"Cell ID", "42"},
+                                                {"Scrambling Code", "388"},
+                                                {"Downlink Frequency", "10713"},
+                                                {"Uplink Frequency", "9763"},
+                                                {"URA ID", "7"}});
+    fixture.feed(monitored(Array{serving(41, 10688, 388)}));
+    EXPECT_EQ(fixture.text("UARFCN"), "10688");
+    EXPECT_EQ(fixture.text("Cell ID"), "41");
+    EXPECT_EQ(fixture.text("URA ID"), "7");
+}
+
+TEST(UMTSRRInfoCellMonitor, AnyCellsKeepItsSectionWithinItsKeys) {
+    anyCellsKeepWithin<UMTSRRInfo>({"RRC State", "Cell ID", "Downlink Frequency",
+                                    "Uplink Frequency", "URA ID", "Ciphering", "Transmit Power",
+                                    "UARFCN", "Scrambling Code"});
+}
+
+} // namespace
+} // namespace pallax

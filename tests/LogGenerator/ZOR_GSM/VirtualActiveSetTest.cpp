@@ -1,0 +1,17 @@
+#include "LogGenerator/ZOR_GSM/VirtualActiveSet.h"
+
+#include "tests/LogGenerator/ZOR_GSM/SearcherRecords.h"
+
+namespace pallax {
+namespace {
+
+TEST(VirtualActiveSet, SubscribesToTheCellListIgnoresShortAndUnknownPacketsAndIsEmptiedByNoCells) {
+    doubles::expectSearcherSet<VirtualActiveSet>("Virtual Active Set", "VirtualActiveSet");
+}
+
+TEST(VirtualActiveSet, IsAlwaysEmptiedWhateverTheCells) {
+    doubles::expectAlwaysEmptied<VirtualActiveSet>();
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,25 @@
+#pragma once
+
+#include "platform/PropertyListCodec.h"
+#include "tests/doubles/RecordBuilder.h"
+
+#include <gtest/gtest.h>
+
+#include <string_view>
+
+namespace pallax::doubles {
+
+/// A record that carries a property list behind its header, in the binary form.
+inline Record propertyListRecord(LogCode logCode, const PropertyList& object) {
+    const auto bytes = serializeBinary(object);
+    EXPECT_TRUE(bytes) << object.description();
+    Record record(logCode);
+    return bytes ? record.append(Bytes(*bytes)) : record;
+}
+
+/// The same with the property list already written, in the XML or the text form.
+inline Record propertyListRecord(LogCode logCode, std::string_view text) {
+    return Record(logCode).append(ByteBuffer(text.begin(), text.end()));
+}
+
+} // namespace pallax::doubles

@@ -1,0 +1,115 @@
+#pragma once
+
+#include "monitor/PallaxModel.h"
+#include "platform/PropertyListCodec.h"
+#include "tests/doubles/FakeBundle.h"
+#include "tests/doubles/FakeGenerator.h"
+#include "tests/doubles/FakePorts.h"
+#include "tests/doubles/FakeResources.h"
+#include "tests/doubles/FakeTelephony.h"
+#include "tests/doubles/ManualClock.h"
+#include "tests/doubles/RecordingLog.h"
+#include "tests/doubles/SteppedQueue.h"
+
+#include <gtest/gtest.h>
+
+namespace pallax::doubles {
+
+/// Counts what it is told.
+class CountingObserver final : public ModelObserver {
+public:
+    int updates = 0;
+    std::function<void()> onUpdate;
+
+    void updateViewControllerFromModel() override {
+        ++updates;
+        if (onUpdate) {
+            onUpdate();
+        }
+    }
+};
+
+/// A model among fakes. The modem answers GetTechnology as `reply` says, first with "Fake".
+class ModelFixture : public testing::Test {
+protected:
+    using Lines = std::vector<RecordingLog::Line>;
+    using Diary = std::vector<std::string>;
+    using Outcome = RemoteMessagePort::Outcome;
+    static constexpr std::size_t kQuery = 0; ///< index of the GetTechnology request
+    static constexpr std::size_t kStart = 1; ///< index of the start command
+
+    void SetUp() override {
+        ports.answer = [this](const RemoteMessagePort::Request& request) {
+            return request.awaitReply ? reply : startOutcome;
+        };
+    }
+
+    static ByteBuffer xml(const PropertyList& object) {
+        const auto text = serializeXml(object);
+        return {text->begin(), text->end()};
+    }
+    static Outcome technology(const PropertyList& name) {
+        return {SendError::None, xml(Dictionary{{"GetTechnology", name}})};
+    }
+
+    void start() { model->startMonitor(); }
+    /// The texts that were logged since the last call, all of priority 3; "Creating Log object"
+    /// (of the generator itself) is left out.
+    Diary errors() {
+        Diary texts;
+        for (const RecordingLog::Line& line : log.take()) {
+            if (line.priority == 3) {
+                texts.push_back(line.text);
+            }
+        }
+        return texts;
+    }
+    std::string createdPorts() const {
+        return formatText(
+            " ***** Created ports (send=%p, recv=%p)",
+            {static_cast<const void*>(ports.remote()), static_cast<const void*>(ports.local())});
+    }
+    static std::string gotGenerator() {
+        return formatText(
+            "Got log generated: %p",
+            {static_cast<const void*>(static_cast<const LogGenerator*>(&generator()))});
+    }
+    static FakeGenerator& generator() { return *FakeGenerator::living.back(); }
+
+    /// True when a start is tried after exactly 5 seconds and not a nanosecond earlier.
+    bool retriesAfter5Seconds() {
+        using namespace std::chrono_literals;
+        const std::size_t before = starts();
+        queue.advance(5s - 1ns);
+        const bool early = starts() != before;
+        queue.advance(1ns);
+        return !early && starts() == before + 1;
+    }
+    /// How often local ports were asked for.
+    std::size_t starts() const {
+        return static_cast<std::size_t>(
+            std::count(ports.diary.begin(), ports.diary.end(),
+                       "local com.norvane.BasebandStateReport.LogChannel"));
+    }
+
+    ManualClock clock;
+    FakeResources resources;
+    FakeBundle bundle;
+    FakePorts ports;
+    FakeTelephony telephony;
+    SteppedQueue queue;
+    CountingObserver observer;
+    RecordingLog log;
+    Outcome reply = technology("Fake");
+    Outcome startOutcome;
+    std::unique_ptr<PallaxModel> model = std::make_unique<PallaxModel>(
+        PallaxModel::Platform{.ports = ports,
+                              .telephony = telephony,
+                              .queue = queue,
+                              .timers = queue,
+                              .generators = {clock, resources, bundle},
+                              .technologies = kFakeTechnologies,
+                              .observer = observer});
+};
+
+} // namespace pallax::doubles
