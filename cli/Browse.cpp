@@ -92,8 +92,11 @@ private:
     void look() {
         _printer.showConnection(_model.isConnected());
         if (_child != nullptr && hasEnded(*_child)) {
-            _childLost = true;
-            _queue.stop();
+            // A signal to the whole process group may be on its way to us too.
+            _queue.after(kLookInterval, [this] {
+                _childLost = true;
+                _queue.stop();
+            });
         }
     }
 
@@ -114,7 +117,7 @@ private:
 };
 
 ExitStatus browse(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child) {
-    Output output(writeToDescriptor(STDOUT_FILENO, "standard output"));
+    Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     bool whole = false;
     {
         Browser browser(std::move(directory), onFatalRecord, child, output);

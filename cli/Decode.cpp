@@ -16,7 +16,7 @@ ExitStatus decodeTo(int descriptor, const DecodeOptions& options) {
     const DirectoryResources resources(DirectoryResources::programFolder());
     const BuildBundle bundle;
     DroppedNotices notices;
-    Output output(writeToDescriptor(descriptor, "standard output"));
+    Output output(writeToDescriptor(descriptor, "Standard output"));
     DecodeCommand command(options, {resources, bundle, notices, technologies()}, Recording::open,
                           complain);
     return command.run(output);

@@ -48,7 +48,7 @@ ExitStatus DecodeCommand::decode(Recording& recording, DisplayOutput& output) {
     }
     RecordingDecoder decoder(_environment, technology->identifier, _options.every, output);
     if (!decoder.hasGenerator()) {
-        _report(formatText("%@: there is no log generator for the technology %@",
+        _report(formatText("%@: there is no log generator for the technology %@.",
                            {recording.name(), technology->identifier}));
         return kExitFailure;
     }

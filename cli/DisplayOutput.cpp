@@ -1,6 +1,7 @@
 #include "cli/DisplayOutput.h"
 
 #include "app/tree/PallaxModelNode.h"
+#include "app/tree/ShownEntries.h"
 #include "cli/DisplayJson.h"
 #include "cli/Utf8.h"
 
@@ -49,18 +50,31 @@ void appendBareNumber(std::string& out, const DisplayNumber& number) {
     appendConverted(out, bare, number.integer());
 }
 
+std::string textOf(const PropertyList& value) {
+    std::string text;
+    if (value.appendString(text)) {
+        return text;
+    }
+    appendJson(text, value);
+    const bool quoted = text.front() == '"'; // base64 or a date, which hold nothing escaped
+    return quoted ? text.substr(1, text.size() - 2) : text;
+}
+
 std::string cellsOf(const PropertyList& value) {
+    const std::string text = textOf(value);
     std::string cells;
-    appendCell(cells, value.string().value_or(""));
+    appendCell(cells, text);
     cells += ',';
-    const DisplayNumber* number = value.displayNumber();
-    if (number != nullptr) {
+    if (const DisplayNumber* number = value.displayNumber()) {
         appendBareNumber(cells, *number);
+        cells += ',';
+        appendCell(cells, number->unit());
+        return cells;
+    }
+    if (value.integer() || std::isfinite(value.real().value_or(NAN))) {
+        cells += text;
     }
     cells += ',';
-    if (number != nullptr) {
-        appendCell(cells, number->unit());
-    }
     return cells;
 }
 
@@ -90,10 +104,7 @@ CsvOutput::CsvOutput(Output& output) : _output(output) {
 void CsvOutput::show(const DisplayMoment& moment, const PropertyList& display) {
     ++_display;
     _time = isoTimeText(moment.time);
-    PathDictionary paths;
-    if (const NodeRef root = PallaxModelNode::makeTreeFromObject(display, paths)) {
-        showNode(*root, "/");
-    }
+    showValue("/", display);
     for (auto at = _shown.begin(); at != _shown.end();) {
         if (at->second.display == _display) {
             ++at;
@@ -104,13 +115,21 @@ void CsvOutput::show(const DisplayMoment& moment, const PropertyList& display) {
     }
 }
 
-void CsvOutput::showNode(const PallaxModelNode& node, const std::string& path) {
-    if (node.childNodes() == nullptr) {
-        showLeaf(path, *node.value());
-        return;
-    }
-    for (const NodeRef& child : *node.childNodes()) {
-        showNode(*child, childPath(path, child->displayName()));
+/// Walks the values as the display tree does, which keeps only texts.
+void CsvOutput::showValue(const std::string& path, const PropertyList& value) {
+    if (const DictionaryRef dictionary = value.dictionary()) {
+        for (const ShownEntry& entry : shownEntries(*dictionary)) {
+            showValue(childPath(path, entry.name), *entry.value);
+        }
+    } else if (const ArrayRef array = value.array()) {
+        int number = 0;
+        for (const PropertyList& element : *array) {
+            if (!element.isNull()) {
+                showValue(childPath(path, std::to_string(number++)), element);
+            }
+        }
+    } else if (!value.isNull()) {
+        showLeaf(path, value);
     }
 }
 

@@ -12,8 +12,6 @@
 
 namespace pallax {
 
-class PallaxModelNode;
-
 /// How often a recording's display is shown.
 enum class Every { End, Tick, Packet };
 
@@ -49,8 +47,9 @@ private:
 /// A table "time,path,value,number,unit" (RFC 4180, lines end in "\n"; the header once): a row
 /// when the value at a path of the display tree is not what it was in the recording's previous
 /// display. The rows of one display come in display order; then, by path, those of the paths that
-/// are gone, whose value, number and unit are empty. `number` is the bare decimal number of a
-/// value that is one, empty for any other (and for one that is not finite).
+/// are gone, whose value, number and unit are empty. A value that is no string is written as in
+/// JSON. `number` is the bare decimal number of a value that is one, empty for any other (and for
+/// one that is not finite).
 class CsvOutput final : public DisplayOutput {
 public:
     explicit CsvOutput(Output& output);
@@ -64,7 +63,7 @@ private:
         std::uint64_t display = 0;
     };
 
-    void showNode(const PallaxModelNode& node, const std::string& path);
+    void showValue(const std::string& path, const PropertyList& value);
     void showLeaf(const std::string& path, const PropertyList& value);
     void writeRow(std::string_view path, std::string_view cells);
 

@@ -108,7 +108,7 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
                  "End with status 70 at a record that cannot be read instead of skipping it");
     app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
         ->required()
-        ->type_name("...");
+        ->type_name("");
     app.footer(kDecodeFooter);
 }
 

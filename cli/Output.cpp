@@ -17,7 +17,7 @@ void writeWhole(int descriptor, const std::string& name, std::string_view block)
             throw OutputClosed();
         } else if (errno != EINTR) {
             const std::string reason = std::generic_category().message(errno);
-            throw OutputFailure("cannot write to " + name + ": " + reason);
+            throw OutputFailure(name + " cannot be written: " + reason + ".");
         }
     }
 }

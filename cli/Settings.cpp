@@ -62,7 +62,7 @@ SettingsResult parseSettings(std::string_view text, std::string_view file) {
         const std::string_view line = text.substr(0, text.find('\n'));
         text.remove_prefix(std::min(line.size() + 1, text.size()));
         if (const auto reason = takeLine(settings, trimmed(line))) {
-            return SettingsError{formatText("%@, line %d: %@", {file, number, *reason})};
+            return SettingsError{formatText("%@, line %d: %@.", {file, number, *reason})};
         }
     }
     return settings;
@@ -76,7 +76,7 @@ SettingsResult loadSettings(const std::vector<std::string>& files) {
         }
         std::ifstream stream(file, std::ios::binary);
         if (!stream.is_open() || !std::filesystem::is_regular_file(file, ignored)) {
-            return SettingsError{file + " cannot be read"};
+            return SettingsError{file + " cannot be read."};
         }
         const std::string text{std::istreambuf_iterator<char>(stream), {}};
         return parseSettings(text, file);

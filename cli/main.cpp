@@ -22,7 +22,8 @@ struct Run {
     }
     ExitStatus operator()(const ParseEnd& end) const {
         const bool wanted = end.status == kExitSuccess;
-        Output output(writeToDescriptor(wanted ? STDOUT_FILENO : STDERR_FILENO, "the terminal"));
+        Output output(writeToDescriptor(wanted ? STDOUT_FILENO : STDERR_FILENO,
+                                        wanted ? "Standard output" : "Standard error"));
         output.text() = end.text;
         output.flush();
         return end.status;

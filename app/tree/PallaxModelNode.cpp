@@ -1,6 +1,7 @@
 #include "app/tree/PallaxModelNode.h"
 
 #include "LogGenerator/Records/ArrayLock.h"
+#include "app/tree/ShownEntries.h"
 
 #include <algorithm>
 #include <utility>
@@ -11,9 +12,6 @@ namespace {
 
 constexpr std::string_view kTitle = "Pallax";
 constexpr std::string_view kUnknown = "(unknown)";
-/// Asks for a dictionary's entries in sorted order; never shown.
-constexpr std::string_view kSortedKey = "_sorted";
-constexpr char kSortSeparator = ';';
 
 /// The array lock, held for a scope.
 class HeldArrayLock {
@@ -23,16 +21,6 @@ public:
     HeldArrayLock(const HeldArrayLock&) = delete;
     HeldArrayLock& operator=(const HeldArrayLock&) = delete;
 };
-
-/// What a sorted dictionary shows of a key: the second of exactly two pieces, else the whole.
-std::string_view nameOfSortedKey(std::string_view key) {
-    const std::size_t separator = key.find(kSortSeparator);
-    if (separator == std::string_view::npos ||
-        key.find(kSortSeparator, separator + 1) != std::string_view::npos) {
-        return key;
-    }
-    return key.substr(separator + 1);
-}
 
 class TreeBuilder {
 public:
@@ -64,24 +52,11 @@ private:
     }
 
     std::vector<NodeRef> childrenOf(const Dictionary& dictionary, const std::string& path) {
-        const PropertyList* mark = dictionary.find(kSortedKey);
-        const bool sorted = mark != nullptr && !mark->isNull();
-        std::vector<const Dictionary::Entry*> shown;
-        shown.reserve(dictionary.size());
-        for (const Dictionary::Entry& entry : dictionary) {
-            if (entry.hasStringKey && entry.key.view() != kSortedKey) {
-                shown.push_back(&entry);
-            }
-        }
-        if (sorted) {
-            std::sort(shown.begin(), shown.end(),
-                      [](const auto* a, const auto* b) { return a->key.view() < b->key.view(); });
-        }
+        const std::vector<ShownEntry> shown = shownEntries(dictionary);
         std::vector<NodeRef> children;
         children.reserve(shown.size());
-        for (const Dictionary::Entry* entry : shown) {
-            const std::string_view key = entry->key.view();
-            append(children, sorted ? nameOfSortedKey(key) : key, entry->value, path);
+        for (const ShownEntry& entry : shown) {
+            append(children, entry.name, *entry.value, path);
         }
         return children;
     }

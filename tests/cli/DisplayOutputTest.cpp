@@ -61,13 +61,30 @@ TEST(CsvOutput, RowsComeInTheOrderOfTheDisplayTree) {
                   {"Cells", Array{Dictionary{{"PCI", "3"}}, "x"}},
                   {"Sorted", Dictionary{{"_sorted", "1"}, {"2;B", "x"}, {"1;A", "y"}}},
                   {"Empty", Array{}},
-                  {"Number", PropertyList::integer(5)},
               }),
               "/Cells/0/PCI,3,,\n"
               "/Cells/1,x,,\n"
               "/Sorted/A,y,,\n"
-              "/Sorted/B,x,,\n"
-              "/Number,(unknown),,\n");
+              "/Sorted/B,x,,\n");
+}
+
+TEST(CsvOutput, AValueThatIsNoStringIsWrittenAsInJson) {
+    EXPECT_EQ(rowsOf(Dictionary{
+                  {"integer", PropertyList::integer(-5)},
+                  {"real", PropertyList::real(0.25)},
+                  {"nan", PropertyList::real(std::nan(""))},
+                  {"boolean", PropertyList::boolean(true)},
+                  {"data", PropertyList::data({0x0F, 0xBD, 0x77})},
+                  {"date", Date(std::chrono::seconds(1700000000))},
+                  {"list", Array{PropertyList(), PropertyList::integer(1)}},
+              }),
+              "/integer,-5,-5,\n"
+              "/real,0.25,0.25,\n"
+              "/nan,null,,\n"
+              "/boolean,true,,\n"
+              "/data,D713,,\n"
+              "/date,2023-11-14T22:13:20Z,,\n"
+              "/list/0,1,1,\n");
 }
 
 TEST(CsvOutput, QuotesWhatATableCannotHold) {

@@ -25,13 +25,13 @@ TEST(Output, HandsTextOnInBigBlocks) {
 TEST(Output, AFullDiskIsNamed) {
     const int full = ::open("/dev/full", O_WRONLY | O_CLOEXEC);
     ASSERT_GE(full, 0);
-    Output output(writeToDescriptor(full, "standard output"));
+    Output output(writeToDescriptor(full, "Standard output"));
     output.text() = "text";
     try {
         output.flush();
         FAIL() << "nothing thrown";
     } catch (const OutputFailure& failure) {
-        EXPECT_STREQ(failure.what(), "cannot write to standard output: No space left on device");
+        EXPECT_STREQ(failure.what(), "Standard output cannot be written: No space left on device.");
     }
     output.flush(); // what could not be written is not tried again
     ::close(full);
@@ -41,7 +41,7 @@ TEST(Output, APipeThatNobodyReadsIsClosed) {
     ::signal(SIGPIPE, SIG_IGN);
     int pipe[2] = {};
     ASSERT_EQ(::pipe(pipe), 0);
-    Output output(writeToDescriptor(pipe[1], "standard output"));
+    Output output(writeToDescriptor(pipe[1], "Standard output"));
     output.text() = "first";
     output.flush();
     char read[5] = {};

@@ -37,12 +37,12 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
 
 TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
     EXPECT_EQ(sentenceFor("\n\ncolour = red\n"),
-              "pallax.conf, line 3: there is no setting \"colour\"");
+              "pallax.conf, line 3: there is no setting \"colour\".");
     EXPECT_EQ(sentenceFor("on-fatal-record = maybe"),
-              "pallax.conf, line 1: on-fatal-record is \"stop\" or \"skip\", not \"maybe\"");
+              "pallax.conf, line 1: on-fatal-record is \"stop\" or \"skip\", not \"maybe\".");
     EXPECT_EQ(sentenceFor("snapshot-directory ="),
-              "pallax.conf, line 1: snapshot-directory needs a path");
-    EXPECT_EQ(sentenceFor("skip"), "pallax.conf, line 1: a setting is written \"key = value\"");
+              "pallax.conf, line 1: snapshot-directory needs a path.");
+    EXPECT_EQ(sentenceFor("skip"), "pallax.conf, line 1: a setting is written \"key = value\".");
 }
 
 class SettingsFileTest : public testing::Test {
@@ -73,7 +73,7 @@ TEST_F(SettingsFileTest, TheFirstFileThatExistsHoldsAlone) {
 TEST_F(SettingsFileTest, AFolderInItsPlaceCannotBeRead) {
     const auto settings = loadSettings({folder.string()});
     ASSERT_FALSE(settings);
-    EXPECT_EQ(settings.error().sentence, folder.string() + " cannot be read");
+    EXPECT_EQ(settings.error().sentence, folder.string() + " cannot be read.");
 }
 
 TEST(SettingsFiles, AreTheUsersThenTheSystems) {

@@ -1,0 +1,44 @@
+#include "app/tree/ShownEntries.h"
+
+#include <algorithm>
+
+namespace pallax {
+
+namespace {
+
+/// Asks for a dictionary's entries in sorted order; never shown.
+constexpr std::string_view kSortedKey = "_sorted";
+constexpr char kSortSeparator = ';';
+
+/// What a sorted dictionary shows of a key: the second of exactly two pieces, else the whole.
+std::string_view nameOfSortedKey(std::string_view key) {
+    const std::size_t separator = key.find(kSortSeparator);
+    if (separator == std::string_view::npos ||
+        key.find(kSortSeparator, separator + 1) != std::string_view::npos) {
+        return key;
+    }
+    return key.substr(separator + 1);
+}
+
+} // namespace
+
+std::vector<ShownEntry> shownEntries(const Dictionary& dictionary) {
+    std::vector<ShownEntry> shown;
+    shown.reserve(dictionary.size());
+    for (const Dictionary::Entry& entry : dictionary) {
+        if (entry.hasStringKey && entry.key.view() != kSortedKey && !entry.value.isNull()) {
+            shown.push_back({entry.key.view(), &entry.value});
+        }
+    }
+    const PropertyList* mark = dictionary.find(kSortedKey);
+    if (mark != nullptr && !mark->isNull()) {
+        std::sort(shown.begin(), shown.end(),
+                  [](const ShownEntry& a, const ShownEntry& b) { return a.name < b.name; });
+        for (ShownEntry& entry : shown) {
+            entry.name = nameOfSortedKey(entry.name);
+        }
+    }
+    return shown;
+}
+
+} // namespace pallax

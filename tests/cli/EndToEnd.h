@@ -1,0 +1,66 @@
+#pragma once
+
+#include "host/RecordingWriter.h"
+#include "samples/Samples.h"
+#include "tests/cli/PallaxProcess.h"
+#include "tests/doubles/RecordBuilder.h"
+
+#include <gtest/gtest.h>
+
+#include <chrono>
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace pallax {
+
+/// The real program over recordings that the test writes.
+class EndToEnd : public testing::Test {
+protected:
+    static constexpr int kGsmLinkType = 148;
+    static constexpr int kUtranLinkType = 151;
+    static constexpr LogCode kRegistration = 0x7132; // byte 13 is the service state
+    static constexpr LogCode kSimFiles = 0xFF0000;
+
+    using Packet = std::pair<std::chrono::milliseconds, ByteBuffer>;
+
+    /// A registration record with its state: 0 is REG_STATE_INACTIVE, 1 REG_STATE_SERVICE_….
+    static ByteBuffer registration(unsigned state) {
+        return doubles::Record(kRegistration).u8(state).u8(0).u8(0).prefixed();
+    }
+
+    /// Writes a recording into the world; its path.
+    std::string record(const std::string& name, const std::vector<Packet>& packets,
+                       int linkType = kGsmLinkType) const {
+        const std::string path = world.path(name);
+        const auto writer = RecordingWriter::create(path, linkType);
+        EXPECT_TRUE(writer) << path;
+        for (const auto& [sinceStart, bytes] : packets) {
+            EXPECT_EQ((*writer)->write(kSampleStart + sinceStart, bytes), std::nullopt);
+        }
+        return path;
+    }
+
+    /// The sample recording of a GSM attach, 48 packets over half a minute.
+    std::string gsmAttach() const {
+        const std::string path = world.path("gsm-attach.pcap");
+        EXPECT_EQ(writeSample(samples().front(), path), std::nullopt);
+        return path;
+    }
+
+    struct Run {
+        int status;
+        std::string out;
+        std::string err;
+    };
+    Run run(const std::vector<std::string>& arguments,
+            const std::string& input = "/dev/null") const {
+        doubles::PallaxProcess process(world, arguments, input);
+        const int status = process.wait();
+        return {status, process.out(), process.err()};
+    }
+
+    doubles::World world;
+};
+
+} // namespace pallax

@@ -1,0 +1,203 @@
+#include "tests/cli/EndToEnd.h"
+
+#include <algorithm>
+#include <csignal>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+
+namespace pallax {
+namespace {
+
+using doubles::eventually;
+using doubles::noChildLeft;
+using doubles::PallaxProcess;
+using std::chrono::milliseconds;
+using std::chrono::seconds;
+
+constexpr const char* kLocalPort = "com.norvane.BasebandStateReport.LogChannel";
+
+std::vector<std::string> headersOf(const std::string& text) {
+    std::vector<std::string> headers;
+    std::istringstream stream(text);
+    for (std::string line; std::getline(stream, line);) {
+        if (line.starts_with("== ")) {
+            headers.push_back(line);
+        }
+    }
+    return headers;
+}
+
+class EndToEndBrowse : public EndToEnd {
+protected:
+    /// A recording that plays for a minute, a packet every 100 ms.
+    std::string minute() const {
+        std::vector<Packet> packets;
+        for (int count = 0; count < 600; ++count) {
+            packets.emplace_back(milliseconds(100) * count, registration(count % 2 == 0 ? 0 : 2));
+        }
+        return record("minute.pcap", packets);
+    }
+
+    bool nothingLeft() const {
+        return noChildLeft() && eventually([this] { return world.sockets().empty(); });
+    }
+};
+
+TEST_F(EndToEndBrowse, ARecordingIsPrintedAtTheTicksOfItsOwnTime) {
+    const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)},
+                                                    {milliseconds(1500), registration(2)},
+                                                    {seconds(7), registration(2)},
+                                                    {seconds(9), registration(0)}});
+    const Run played = run({recording, "--print", "--speed", "max"});
+    EXPECT_EQ(played.status, 0);
+    EXPECT_EQ(played.err, "");
+    EXPECT_EQ(headersOf(played.out), (std::vector<std::string>{"== 2023-11-14 22:13:22 +0000",
+                                                               "== 2023-11-14 22:13:28 +0000",
+                                                               "== 2023-11-14 22:13:30 +0000"}));
+    EXPECT_NE(played.out.find("\nProcess CO\n  MM Service State: REG_STATE_REGISTERING\n"),
+              std::string::npos)
+        << played.out;
+    EXPECT_NE(played.out.find("\nProcess CO\n* MM Service State: REG_STATE_INACTIVE\n"),
+              std::string::npos)
+        << played.out;
+    EXPECT_TRUE(nothingLeft());
+}
+
+TEST_F(EndToEndBrowse, TheTicksAreThoseOfDecode) {
+    const std::string recording = gsmAttach();
+    const Run decoded = run({"decode", "--every", "tick", recording});
+    const Run played = run({recording, "--speed", "max"});
+    EXPECT_EQ(played.status, 0);
+    EXPECT_EQ(static_cast<std::ptrdiff_t>(headersOf(played.out).size()),
+              std::count(decoded.out.begin(), decoded.out.end(), '\n'));
+    EXPECT_EQ(played.out, run({recording, "--speed", "max"}).out) << "played twice, printed alike";
+    EXPECT_EQ(played.out, run({"-", "--speed", "max"}, recording).out);
+    EXPECT_TRUE(nothingLeft());
+}
+
+TEST_F(EndToEndBrowse, ARecordingThatCannotBeOpenedIsAFailure) {
+    const Run missing = run({world.path("missing.pcap")});
+    EXPECT_EQ(missing.status, 1);
+    EXPECT_EQ(missing.out, "");
+    EXPECT_EQ(missing.err, "pallax: " + world.path("missing.pcap") +
+                               " cannot be opened: No such file or directory.\n");
+    EXPECT_TRUE(nothingLeft());
+}
+
+TEST_F(EndToEndBrowse, ACutRecordingIsPlayedReportedAndAFailure) {
+    const std::string recording =
+        record("a.pcap", {{milliseconds(0), registration(2)}, {seconds(1), registration(0)}});
+    std::filesystem::resize_file(recording, std::filesystem::file_size(recording) - 1);
+    const Run cut = run({recording, "--speed", "max"});
+    EXPECT_EQ(cut.status, 1);
+    EXPECT_EQ(headersOf(cut.out).size(), 1U);
+    EXPECT_EQ(cut.err, "pallax: " + recording + " ends in the middle of a packet.\n");
+    EXPECT_TRUE(nothingLeft());
+}
+
+TEST_F(EndToEndBrowse, WhileItPlaysThereAreSocketsAndAfterASignalThereAreNone) {
+    for (const int number : {SIGINT, SIGTERM}) {
+        PallaxProcess viewer(world, {minute(), "--speed", "10"});
+        EXPECT_TRUE(viewer.says("== "));
+        EXPECT_GE(world.sockets().size(), 3U) << "control port, log channel, viewer's port";
+        viewer.signal(number);
+        EXPECT_EQ(viewer.wait(), 0);
+        EXPECT_EQ(viewer.err(), "");
+        EXPECT_TRUE(nothingLeft());
+    }
+}
+
+TEST_F(EndToEndBrowse, AKilledViewerTakesItsServiceAlong) {
+    {
+        PallaxProcess viewer(world, {minute(), "--speed", "10"});
+        EXPECT_TRUE(viewer.says("== "));
+        viewer.signal(SIGKILL);
+        EXPECT_EQ(viewer.wait(), -SIGKILL);
+    }
+    EXPECT_TRUE(noChildLeft());
+    EXPECT_EQ(run({gsmAttach(), "--speed", "max"}).status, 0);
+    EXPECT_TRUE(nothingLeft()) << "the next run removes what the killed one has left";
+}
+
+TEST_F(EndToEndBrowse, TwoRecordingsCanBeBrowsedAtOnce) {
+    const std::string recording = minute();
+    PallaxProcess first(world, {recording, "--speed", "10"});
+    EXPECT_TRUE(first.says("== "));
+    PallaxProcess second(world, {recording, "--speed", "10"});
+    EXPECT_TRUE(second.says("== "));
+    first.signal(SIGINT);
+    EXPECT_EQ(first.wait(), 0);
+    second.signal(SIGINT);
+    EXPECT_EQ(second.wait(), 0);
+    EXPECT_TRUE(nothingLeft());
+}
+
+TEST_F(EndToEndBrowse, AServiceCannotBeStartedTwice) {
+    const std::string recording = minute();
+    PallaxProcess service(world, {"service", "--play", recording, "--loop"});
+    EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
+    const Run second = run({"service", "--play", recording});
+    EXPECT_EQ(second.status, 1);
+    EXPECT_NE(second.err.find("already running"), std::string::npos) << second.err;
+    service.signal(SIGTERM);
+    EXPECT_EQ(service.wait(), 0);
+    EXPECT_TRUE(nothingLeft());
+}
+
+TEST_F(EndToEndBrowse, ASecondViewerOfTheLiveModemFindsThePortInUse) {
+    PallaxProcess service(world, {"service", "--play", minute(), "--loop"});
+    EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
+    PallaxProcess first(world, {"--log-level", "3"});
+    EXPECT_TRUE(first.says("<3>Starting the display update timer\n"));
+    const auto sockets = world.sockets();
+    EXPECT_NE(std::find(sockets.begin(), sockets.end(), kLocalPort), sockets.end());
+
+    PallaxProcess second(world, {"--log-level", "3"});
+    EXPECT_TRUE(second.says("<3>Local messsage port already exists\n"));
+    EXPECT_TRUE(second.says("<3>Could not create the ports necessary\n"));
+    EXPECT_TRUE(second.says("Connecting...\n"));
+    EXPECT_EQ(world.sockets(), sockets) << "the first one's port stays";
+    second.signal(SIGTERM);
+    EXPECT_EQ(second.wait(), 0);
+    first.signal(SIGTERM);
+    EXPECT_EQ(first.wait(), 0);
+    service.signal(SIGTERM);
+    EXPECT_EQ(service.wait(), 0);
+    EXPECT_TRUE(nothingLeft());
+}
+
+TEST_F(EndToEndBrowse, AViewerFindsAServiceThatComesLaterAndOneThatComesAgain) {
+    const std::string recording = minute();
+    PallaxProcess viewer(world, {"--log-level", "3"});
+    EXPECT_TRUE(viewer.says("<3>Could not create HXServerConnection\n"));
+    EXPECT_TRUE(viewer.says("Connecting...\n"));
+    {
+        PallaxProcess service(world, {"service", "--play", recording, "--speed", "10"});
+        EXPECT_TRUE(viewer.says("== ")) << "tried again 5 seconds later";
+        service.signal(SIGKILL);
+        EXPECT_EQ(service.wait(), -SIGKILL);
+    }
+    EXPECT_TRUE(viewer.says("INVALIDATED"));
+    EXPECT_TRUE(viewer.says("Connecting...\n"));
+    const std::size_t before = headersOf(viewer.out()).size();
+    PallaxProcess again(world, {"service", "--play", recording, "--speed", "10"});
+    EXPECT_TRUE(eventually([&] { return headersOf(viewer.out()).size() > before; }));
+    viewer.signal(SIGTERM);
+    EXPECT_EQ(viewer.wait(), 0);
+    again.signal(SIGTERM);
+    EXPECT_EQ(again.wait(), 0);
+    EXPECT_TRUE(nothingLeft());
+}
+
+TEST_F(EndToEndBrowse, AMistakeInTheSettingsIsNamed) {
+    std::filesystem::create_directories(world.path("config/pallax"));
+    const std::string file = world.path("config/pallax/pallax.conf");
+    std::ofstream(file) << "colour = red\n";
+    const Run wrong = run({gsmAttach()});
+    EXPECT_EQ(wrong.status, 1);
+    EXPECT_EQ(wrong.err, "pallax: " + file + ", line 1: there is no setting \"colour\".\n");
+}
+
+} // namespace
+} // namespace pallax

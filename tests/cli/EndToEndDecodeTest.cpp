@@ -1,0 +1,177 @@
+#include "tests/cli/EndToEnd.h"
+
+#include <nlohmann/json.hpp>
+
+#include <algorithm>
+#include <fcntl.h>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace pallax {
+namespace {
+
+using std::chrono::milliseconds;
+using std::chrono::seconds;
+
+std::vector<nlohmann::ordered_json> linesOf(const std::string& text) {
+    std::vector<nlohmann::ordered_json> lines;
+    std::istringstream stream(text);
+    for (std::string line; std::getline(stream, line);) {
+        lines.push_back(nlohmann::ordered_json::parse(line));
+    }
+    return lines;
+}
+
+std::string contentOf(const std::string& path) {
+    std::ostringstream content;
+    content << std::ifstream(path, std::ios::binary).rdbuf();
+    return content.str();
+}
+
+TEST_F(EndToEnd, DecodeGivesTheDisplayAfterTheLastPacket) {
+    const std::string recording =
+        record("a.pcap", {{milliseconds(0), registration(0)}, {seconds(5), registration(2)}});
+    const Run end = run({"decode", recording});
+    EXPECT_EQ(end.status, 0);
+    EXPECT_EQ(end.err, "");
+    const auto lines = linesOf(end.out);
+    ASSERT_EQ(lines.size(), 1U);
+    EXPECT_EQ(lines[0]["Process CO"]["MM Service State"], "REG_STATE_REGISTERING");
+}
+
+TEST_F(EndToEnd, DecodeAtEachTickAndPacket) {
+    const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)},
+                                                    {milliseconds(1500), registration(2)},
+                                                    {seconds(7), registration(0)}});
+    const auto ticks = linesOf(run({"decode", "--every", "tick", recording}).out);
+    ASSERT_EQ(ticks.size(), 2U);
+    EXPECT_EQ(ticks[0]["tick"], 1);
+    EXPECT_EQ(ticks[0]["time"], "2023-11-14T22:13:22.000Z");
+    EXPECT_EQ(ticks[0]["display"]["Process CO"]["MM Service State"], "REG_STATE_REGISTERING");
+    EXPECT_EQ(ticks[1]["tick"], 4);
+    EXPECT_EQ(ticks[1]["time"], "2023-11-14T22:13:28.000Z");
+    EXPECT_EQ(ticks[1]["display"]["Process CO"]["MM Service State"], "REG_STATE_INACTIVE");
+
+    const auto packets = linesOf(run({"decode", "--every", "packet", recording}).out);
+    ASSERT_EQ(packets.size(), 3U);
+    EXPECT_EQ(packets[1]["packet"], 2);
+    EXPECT_EQ(packets[1]["time"], "2023-11-14T22:13:21.500Z");
+    EXPECT_EQ(packets[1]["display"]["Process CO"]["MM Service State"], "REG_STATE_REGISTERING");
+}
+
+TEST_F(EndToEnd, DecodeToCsv) {
+    const std::string recording =
+        record("a.pcap", {{milliseconds(0), registration(0)}, {seconds(3), registration(2)}});
+    const Run csv = run({"decode", "--every", "tick", "--format", "csv", recording});
+    EXPECT_EQ(csv.status, 0);
+    EXPECT_TRUE(csv.out.starts_with("time,path,value,number,unit\n")) << csv.out;
+    EXPECT_NE(csv.out.find("2023-11-14T22:13:22.000Z,/Process CO/MM Service State,"
+                           "REG_STATE_INACTIVE,,\n"),
+              std::string::npos)
+        << csv.out;
+    EXPECT_NE(csv.out.find("2023-11-14T22:13:24.000Z,/Process CO/MM Service State,"
+                           "REG_STATE_REGISTERING,,\n"),
+              std::string::npos)
+        << csv.out;
+}
+
+TEST_F(EndToEnd, DecodeReadsStandardInput) {
+    const std::string recording = gsmAttach();
+    EXPECT_EQ(run({"decode", "-"}, recording).out, run({"decode", recording}).out);
+}
+
+TEST_F(EndToEnd, TheSystemLogIsWrittenUnmaskedToItsFile) {
+    const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)}});
+    const std::string log = world.path("log");
+    EXPECT_EQ(run({"decode", "--system-log", log, recording}).status, 0);
+    const std::string lines = contentOf(log);
+    EXPECT_TRUE(lines.find("<3>Creating ZOR_GSMLogGenerator object\n") != std::string::npos);
+    EXPECT_TRUE(lines.find("<6>Log Header 0x81\n") != std::string::npos) << lines;
+}
+
+TEST_F(EndToEnd, ASystemLogThatCannotBeOpenedIsAFailure) {
+    const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)}});
+    const std::string log = world.path("missing/log");
+    const Run failed = run({"decode", "--system-log", log, recording});
+    EXPECT_EQ(failed.status, 1);
+    EXPECT_EQ(failed.out, "");
+    EXPECT_EQ(failed.err,
+              "pallax: The log file " + log + " cannot be written: No such file or directory.\n");
+}
+
+TEST_F(EndToEnd, ACutRecordingIsDecodedReportedAndAFailure) {
+    const std::string recording =
+        record("a.pcap", {{milliseconds(0), registration(2)}, {seconds(1), registration(0)}});
+    std::filesystem::resize_file(recording, std::filesystem::file_size(recording) - 1);
+    const Run cut = run({"decode", recording});
+    EXPECT_EQ(cut.status, 1);
+    EXPECT_EQ(cut.err, "pallax: " + recording + " ends in the middle of a packet.\n");
+    ASSERT_EQ(linesOf(cut.out).size(), 1U);
+    EXPECT_EQ(linesOf(cut.out)[0]["Process CO"]["MM Service State"], "REG_STATE_REGISTERING");
+}
+
+TEST_F(EndToEnd, ABadRecordingDoesNotKeepTheOthersFromBeingDecoded) {
+    const std::string good = record("good.pcap", {{milliseconds(0), registration(0)}});
+    const std::string missing = world.path("missing.pcap");
+    const std::string noCapture = world.path("text.pcap");
+    std::ofstream(noCapture) << "this is no capture, whatever its name says";
+    const Run mixed = run({"decode", missing, noCapture, good});
+    EXPECT_EQ(mixed.status, 1);
+    EXPECT_EQ(linesOf(mixed.out).size(), 1U);
+    EXPECT_NE(mixed.err.find(missing), std::string::npos) << mixed.err;
+    EXPECT_NE(mixed.err.find(noCapture), std::string::npos) << mixed.err;
+    EXPECT_EQ(std::count(mixed.err.begin(), mixed.err.end(), '\n'), 2) << mixed.err;
+}
+
+TEST_F(EndToEnd, AForeignLinkTypeNeedsTheTechnologyOption) {
+    constexpr int kEthernet = 1;
+    const std::string recording = record("a.pcap", {{milliseconds(0), registration(2)}}, kEthernet);
+    const Run foreign = run({"decode", recording});
+    EXPECT_EQ(foreign.status, 1);
+    EXPECT_NE(foreign.err.find(recording), std::string::npos) << foreign.err;
+    const Run told = run({"decode", "--technology", "gsm", recording});
+    EXPECT_EQ(told.status, 0);
+    EXPECT_EQ(linesOf(told.out).at(0)["Process CO"]["MM Service State"], "REG_STATE_REGISTERING");
+}
+
+TEST_F(EndToEnd, WrongUsageIsStatus2AndOneSentence) {
+    const Run wrong = run({"decode", "--every", "day", "a.pcap"});
+    EXPECT_EQ(wrong.status, 2);
+    EXPECT_EQ(wrong.out, "");
+    EXPECT_EQ(wrong.err,
+              "pallax: --every: \"day\" is none of end|tick|packet (pallax --help tells more)\n");
+    EXPECT_EQ(run({"--version"}).status, 0);
+}
+
+TEST_F(EndToEnd, AFullDiskIsAFailureWithASentence) {
+    doubles::PallaxProcess process(world, {"decode", gsmAttach()}, "/dev/null", "/dev/full");
+    EXPECT_EQ(process.wait(), 1);
+    EXPECT_EQ(process.err(),
+              "pallax: Standard output cannot be written: No space left on device.\n");
+}
+
+TEST_F(EndToEnd, AClosedPipeEndsQuietly) {
+    const std::string fifo = world.path("fifo");
+    ASSERT_EQ(::mkfifo(fifo.c_str(), 0600), 0);
+    std::vector<Packet> packets(5000, {milliseconds(0), registration(1)});
+    const std::string recording = record("long.pcap", packets);
+    // Opened first, for the program's own opening waits for a reader.
+    const int reader = ::open(fifo.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
+    ASSERT_GE(reader, 0);
+    doubles::PallaxProcess process(world, {"decode", "--every", "packet", recording}, "/dev/null",
+                                   fifo);
+    std::string read(10, ' ');
+    EXPECT_TRUE(doubles::eventually([&] {
+        return ::read(reader, read.data(), read.size()) == static_cast<ssize_t>(read.size());
+    }));
+    EXPECT_EQ(read, "{\"packet\":");
+    ::close(reader);
+    EXPECT_EQ(process.wait(), 0);
+    EXPECT_EQ(process.err(), "");
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,150 @@
+#include "tests/cli/PallaxProcess.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <array>
+#include <csignal>
+#include <cstdlib>
+#include <fcntl.h>
+#include <fstream>
+#include <iterator>
+#include <spawn.h>
+#include <sys/prctl.h>
+#include <sys/wait.h>
+#include <thread>
+#include <unistd.h>
+
+namespace pallax::doubles {
+
+namespace {
+
+using std::chrono::milliseconds;
+using std::chrono::seconds;
+
+constexpr milliseconds kLook{5};
+
+bool within(std::chrono::nanoseconds patience, const std::function<bool()>& condition) {
+    const auto end = std::chrono::steady_clock::now() + patience;
+    while (!condition()) {
+        if (std::chrono::steady_clock::now() > end) {
+            return false;
+        }
+        std::this_thread::sleep_for(kLook);
+    }
+    return true;
+}
+
+std::string contentOf(const std::string& path) {
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+}
+
+std::vector<char*> pointersTo(std::vector<std::string>& texts) {
+    std::vector<char*> pointers;
+    pointers.reserve(texts.size() + 1);
+    for (std::string& text : texts) {
+        pointers.push_back(text.data());
+    }
+    pointers.push_back(nullptr);
+    return pointers;
+}
+
+} // namespace
+
+World::World() {
+    (void)::prctl(PR_SET_CHILD_SUBREAPER, 1);
+    std::string name = testing::TempDir() + "pallax-XXXXXX";
+    _folder = ::mkdtemp(name.data());
+}
+
+World::~World() {
+    std::filesystem::remove_all(_folder);
+}
+
+std::vector<std::string> World::sockets() const {
+    std::vector<std::string> names;
+    std::error_code missing;
+    for (const auto& entry : std::filesystem::directory_iterator(_folder / "pallax", missing)) {
+        if (entry.is_socket()) {
+            names.push_back(entry.path().filename().string());
+        }
+    }
+    std::sort(names.begin(), names.end());
+    return names;
+}
+
+bool eventually(const std::function<bool()>& condition) {
+    return within(seconds(10), condition);
+}
+
+bool noChildLeft() {
+    return eventually([] { return ::waitpid(-1, nullptr, WNOHANG) < 0; });
+}
+
+PallaxProcess::PallaxProcess(const World& world, const std::vector<std::string>& arguments,
+                             const std::string& input, const std::string& output) {
+    static int count = 0;
+    const std::string number = std::to_string(++count);
+    _out = output.empty() ? world.path("out." + number) : output;
+    _err = world.path("err." + number);
+
+    std::vector<std::string> words{PALLAX_PROGRAM};
+    words.insert(words.end(), arguments.begin(), arguments.end());
+    std::vector<std::string> environment{"XDG_RUNTIME_DIR=" + world.folder().string(),
+                                         "XDG_CONFIG_HOME=" + world.path("config"), "TZ=UTC"};
+    posix_spawn_file_actions_t files;
+    ::posix_spawn_file_actions_init(&files);
+    ::posix_spawn_file_actions_addopen(&files, STDIN_FILENO, input.c_str(), O_RDONLY, 0);
+    constexpr mode_t kMode = 0600;
+    constexpr int kWrite = O_WRONLY | O_CREAT | O_TRUNC;
+    ::posix_spawn_file_actions_addopen(&files, STDOUT_FILENO, _out.c_str(), kWrite, kMode);
+    ::posix_spawn_file_actions_addopen(&files, STDERR_FILENO, _err.c_str(), kWrite, kMode);
+    const int error = ::posix_spawn(&_process, PALLAX_PROGRAM, &files, nullptr,
+                                    pointersTo(words).data(), pointersTo(environment).data());
+    ::posix_spawn_file_actions_destroy(&files);
+    if (error != 0) {
+        ADD_FAILURE() << PALLAX_PROGRAM << " cannot be started";
+        _process = -1;
+    }
+}
+
+PallaxProcess::~PallaxProcess() {
+    if (_process > 0) {
+        signal(SIGKILL);
+        (void)::waitpid(_process, nullptr, 0);
+    }
+}
+
+int PallaxProcess::wait() {
+    int status = 0;
+    const bool ended =
+        within(seconds(20), [&] { return ::waitpid(_process, &status, WNOHANG) == _process; });
+    if (!ended) {
+        ADD_FAILURE() << "it does not end\n" << out() << err();
+        signal(SIGKILL);
+        (void)::waitpid(_process, &status, 0);
+    }
+    _process = -1;
+    return WIFEXITED(status) ? WEXITSTATUS(status) : -WTERMSIG(status);
+}
+
+void PallaxProcess::signal(int number) const {
+    (void)::kill(_process, number);
+}
+
+std::string PallaxProcess::out() const {
+    return contentOf(_out);
+}
+
+std::string PallaxProcess::err() const {
+    return contentOf(_err);
+}
+
+bool PallaxProcess::says(const std::string& text) const {
+    return eventually([&] {
+        return out().find(text) != std::string::npos || err().find(text) != std::string::npos;
+    });
+}
+
+} // namespace pallax::doubles

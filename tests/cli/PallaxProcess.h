@@ -1,0 +1,64 @@
+#pragma once
+
+#include <chrono>
+#include <filesystem>
+#include <functional>
+#include <string>
+#include <sys/types.h>
+#include <vector>
+
+namespace pallax::doubles {
+
+/// A private world for real `pallax` processes: a folder for their sockets, settings and output,
+/// removed at the end. What a process leaves behind becomes this process's child, so that nothing
+/// can stay unnoticed.
+class World {
+public:
+    World();
+    ~World();
+    World(const World&) = delete;
+    World& operator=(const World&) = delete;
+
+    const std::filesystem::path& folder() const { return _folder; }
+    std::string path(const std::string& name) const { return (_folder / name).string(); }
+    /// The sockets there are now, sorted.
+    std::vector<std::string> sockets() const;
+
+private:
+    std::filesystem::path _folder;
+};
+
+/// True once `condition` holds; false when it does not within ten seconds.
+bool eventually(const std::function<bool()>& condition);
+
+/// True when no child process is left, waiting a little for those that are about to end.
+bool noChildLeft();
+
+/// One run of the real `pallax` program in a world.
+class PallaxProcess {
+public:
+    /// Standard input is `input` (a path); standard output goes to `output` when that is given.
+    PallaxProcess(const World& world, const std::vector<std::string>& arguments,
+                  const std::string& input = "/dev/null", const std::string& output = "");
+    /// Kills it if it still runs.
+    ~PallaxProcess();
+    PallaxProcess(const PallaxProcess&) = delete;
+    PallaxProcess& operator=(const PallaxProcess&) = delete;
+
+    /// The exit status; minus the signal's number when a signal ended it. Fails a test and kills
+    /// the process when it does not end within 20 seconds.
+    int wait();
+    void signal(int number) const;
+
+    std::string out() const;
+    std::string err() const;
+    /// Waits until standard output or error hold the text.
+    bool says(const std::string& text) const;
+
+private:
+    pid_t _process = -1;
+    std::string _out;
+    std::string _err;
+};
+
+} // namespace pallax::doubles
