@@ -28,4 +28,8 @@ inline constexpr Time kSampleStart{std::chrono::seconds{1700000000}};
 /// update, detach.
 std::vector<SamplePacket> gsmAttachPackets();
 
+/// Two minutes of a UMTS and GSM phone in a car: cell changes, a data session, a stretch of GSM
+/// behind a hill, neighbours that come and go.
+std::vector<SamplePacket> umtsDrivePackets();
+
 } // namespace pallax

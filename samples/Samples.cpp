@@ -10,6 +10,7 @@ namespace pallax {
 std::span<const Sample> samples() {
     static constexpr auto kSamples = std::to_array<Sample>({
         {"gsm-attach.pcap", "gsm", gsmAttachPackets},
+        {"umts-drive.pcap", "gsm", umtsDrivePackets},
     });
     return kSamples;
 }
