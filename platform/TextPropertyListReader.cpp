@@ -191,7 +191,8 @@ PropertyList TextReader::array(std::size_t depth) {
 PropertyList TextReader::data() {
     const std::size_t start = _at++;
     ByteBuffer bytes;
-    std::optional<unsigned> high;
+    unsigned high = 0;
+    bool half = false;
     for (; peek() != '>'; ++_at) {
         if (atEnd()) {
             refuse(start, "data without its \">\"");
@@ -203,14 +204,13 @@ PropertyList TextReader::data() {
         if (!digit) {
             refuse(_at, "data with something other than hex digits");
         }
-        if (high) {
-            bytes.push_back(static_cast<std::uint8_t>(*high * 16 + *digit));
-            high.reset();
-        } else {
-            high = digit;
+        if (half) {
+            bytes.push_back(static_cast<std::uint8_t>(high * 16 + *digit));
         }
+        high = *digit;
+        half = !half;
     }
-    if (high) {
+    if (half) {
         refuse(start, "data with half a byte");
     }
     ++_at;
