@@ -16,8 +16,8 @@ constexpr unsigned kByteBits = 8;
 constexpr std::array<std::uint8_t, 256> kDigits = [] {
     std::array<std::uint8_t, 256> digits{};
     digits.fill(kNoDigit);
-    for (std::uint8_t digit = 0; digit < kAlphabet.size(); ++digit) {
-        digits.at(static_cast<std::uint8_t>(kAlphabet[digit])) = digit;
+    for (std::size_t digit = 0; digit < kAlphabet.size(); ++digit) {
+        digits.at(static_cast<std::uint8_t>(kAlphabet[digit])) = static_cast<std::uint8_t>(digit);
     }
     return digits;
 }();

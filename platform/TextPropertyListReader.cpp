@@ -192,7 +192,7 @@ PropertyList TextReader::data() {
     const std::size_t start = _at++;
     ByteBuffer bytes;
     unsigned high = 0;
-    bool half = false; // a first digit waits in `high` for its second
+    bool half = false;
     for (; peek() != '>'; ++_at) {
         if (atEnd()) {
             refuse(start, "data without its \">\"");
@@ -206,9 +206,8 @@ PropertyList TextReader::data() {
         }
         if (half) {
             bytes.push_back(static_cast<std::uint8_t>(high * 16 + *digit));
-        } else {
-            high = *digit;
         }
+        high = *digit;
         half = !half;
     }
     if (half) {

@@ -273,7 +273,7 @@ PropertyList readXml(Bytes bytes) {
         refuse(start + static_cast<std::size_t>(std::max<std::ptrdiff_t>(parsed.offset, 0)),
                std::string("malformed XML: ") + parsed.description());
     }
-    return XmlReader(start).document(document);
+    return XmlReader(start).document(document.root());
 }
 
 } // namespace
