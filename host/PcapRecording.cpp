@@ -109,9 +109,6 @@ Result<std::FILE*, RecordingError> openFile(const std::string& path, const std::
 }
 
 RecordingError noCapture(std::FILE* file, const std::string& name, std::string_view reason) {
-    if (std::ferror(file) != 0) {
-        return errorOf(Kind::Unreadable, name, formatText("cannot be read: %@", {reason}));
-    }
     if (std::feof(file) != 0) {
         return errorOf(Kind::NoCapture, name,
                        "is no recording: it ends before the header of a capture is whole");

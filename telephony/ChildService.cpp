@@ -139,6 +139,7 @@ Result<std::unique_ptr<ChildService>, HostError> ChildService::start(ServiceOpti
     options.controlPortName = std::string(kTelephonyControlPort) + suffix;
     std::vector<std::string> arguments = argumentsFor(options);
     std::vector<char*> pointers;
+    pointers.reserve(arguments.size() + 1);
     for (std::string& argument : arguments) {
         pointers.push_back(argument.data());
     }
