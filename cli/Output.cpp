@@ -1,5 +1,7 @@
 #include "cli/Output.h"
 
+#include "platform/Format.h"
+
 #include <cerrno>
 #include <system_error>
 #include <unistd.h>
@@ -17,7 +19,7 @@ void writeWhole(int descriptor, const std::string& name, std::string_view block)
             throw OutputClosed();
         } else if (errno != EINTR) {
             const std::string reason = std::generic_category().message(errno);
-            throw OutputFailure(name + " cannot be written: " + reason + ".");
+            throw OutputFailure(formatText("%@ cannot be written: %@.", {name, reason}));
         }
     }
 }

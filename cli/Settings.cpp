@@ -86,7 +86,7 @@ SettingsResult loadSettings(const std::vector<std::string>& files) {
 
 std::vector<std::string> settingsFiles() {
     std::vector<std::string> files;
-    const auto add = [&files](std::filesystem::path folder) {
+    const auto add = [&files](const std::filesystem::path& folder) {
         files.push_back((folder / kFile).string());
     };
     const char* configuration = std::getenv("XDG_CONFIG_HOME");

@@ -18,7 +18,6 @@ namespace pallax {
 class EndToEnd : public testing::Test {
 protected:
     static constexpr int kGsmLinkType = 148;
-    static constexpr int kUtranLinkType = 151;
     static constexpr LogCode kRegistration = 0x7132; // byte 13 is the service state
     static constexpr LogCode kSimFiles = 0xFF0000;
 
@@ -27,6 +26,11 @@ protected:
     /// A registration record with its state: 0 is REG_STATE_INACTIVE, 1 REG_STATE_SERVICE_….
     static ByteBuffer registration(unsigned state) {
         return doubles::Record(kRegistration).u8(state).u8(0).u8(0).prefixed();
+    }
+
+    /// A SIM-file record whose property list cannot be parsed: its parser throws.
+    static ByteBuffer unreadableSimFiles() {
+        return doubles::Record(kSimFiles).append({'n', 'o', ' ', '{'}).prefixed();
     }
 
     /// Writes a recording into the world; its path.

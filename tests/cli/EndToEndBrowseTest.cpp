@@ -190,6 +190,29 @@ TEST_F(EndToEndBrowse, AViewerFindsAServiceThatComesLaterAndOneThatComesAgain) {
     EXPECT_TRUE(nothingLeft());
 }
 
+TEST_F(EndToEndBrowse, ARecordThatThrowsEndsTheViewerWithStatus70) {
+    const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)},
+                                                    {seconds(3), unreadableSimFiles()},
+                                                    {seconds(5), registration(2)}});
+    const std::string sentence =
+        "packet 2 (log code 0xFF0000): the embedded property list cannot be parsed\n";
+    const Run stopped = run({recording, "--speed", "max"});
+    EXPECT_EQ(stopped.status, 70);
+    EXPECT_EQ(stopped.err, "pallax: " + sentence);
+    EXPECT_EQ(headersOf(stopped.out).size(), 1U);
+    EXPECT_TRUE(nothingLeft());
+
+    const Run kept = run({recording, "--speed", "max", "--keep-going", "--log-level", "3"});
+    EXPECT_EQ(kept.status, 0);
+    EXPECT_NE(kept.err.find("<3>" + sentence), std::string::npos) << kept.err;
+    EXPECT_EQ(headersOf(kept.out).size(), 2U);
+
+    std::filesystem::create_directories(world.path("config/pallax"));
+    std::ofstream(world.path("config/pallax/pallax.conf")) << "on-fatal-record = skip\n";
+    EXPECT_EQ(run({recording, "--speed", "max"}).status, 0);
+    EXPECT_TRUE(nothingLeft());
+}
+
 TEST_F(EndToEndBrowse, AMistakeInTheSettingsIsNamed) {
     std::filesystem::create_directories(world.path("config/pallax"));
     const std::string file = world.path("config/pallax/pallax.conf");

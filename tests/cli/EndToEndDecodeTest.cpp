@@ -126,6 +126,25 @@ TEST_F(EndToEnd, ABadRecordingDoesNotKeepTheOthersFromBeingDecoded) {
     EXPECT_EQ(std::count(mixed.err.begin(), mixed.err.end(), '\n'), 2) << mixed.err;
 }
 
+TEST_F(EndToEnd, ARecordThatThrowsIsReportedAndSkipped) {
+    const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)},
+                                                    {milliseconds(1), unreadableSimFiles()},
+                                                    {milliseconds(2), registration(2)}});
+    const std::string sentence =
+        "pallax: " + recording +
+        ": packet 2 (log code 0xFF0000): the embedded property list cannot be parsed\n";
+    const Run skipped = run({"decode", recording});
+    EXPECT_EQ(skipped.status, 0);
+    EXPECT_EQ(skipped.err, sentence);
+    EXPECT_EQ(linesOf(skipped.out).at(0)["Process CO"]["MM Service State"],
+              "REG_STATE_REGISTERING");
+
+    const Run strict = run({"decode", "--strict", "--every", "packet", recording});
+    EXPECT_EQ(strict.status, 70);
+    EXPECT_EQ(strict.err, sentence);
+    EXPECT_EQ(linesOf(strict.out).size(), 1U);
+}
+
 TEST_F(EndToEnd, AForeignLinkTypeNeedsTheTechnologyOption) {
     constexpr int kEthernet = 1;
     const std::string recording = record("a.pcap", {{milliseconds(0), registration(2)}}, kEthernet);
