@@ -5,6 +5,7 @@
 // The one exception that a record may throw is that of a SIM-file record whose property list
 // cannot be parsed. Everything else, an index past a record's own count above all, ends the run.
 
+#include "LogGenerator/Common/LogCode_0xFF000020.h"
 #include "LogGenerator/Records/Exceptions.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMLogGenerator.h"
 #include "platform/SystemLog.h"

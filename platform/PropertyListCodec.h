@@ -31,7 +31,7 @@ inline constexpr std::size_t kLargestPropertyList = std::size_t{64} << 20U;
 inline constexpr std::size_t kDeepestPropertyList = 512;
 /// Values beyond one for each input byte that shared references may expand to; a form without
 /// references cannot reach it.
-inline constexpr std::size_t kMostExpandedValues = std::size_t{1} << 20U;
+inline constexpr std::size_t kMostExpandedValues = std::size_t{1} << 16U;
 
 /// Reads any of the three forms, told apart by their first bytes.
 PropertyListResult parsePropertyList(Bytes bytes);
