@@ -34,8 +34,8 @@ std::uint32_t energyOf(const LogRecord& path) {
 std::int64_t rscp_db(std::int64_t receiveAgc, std::int64_t ecio_db) {
     constexpr std::int64_t kAgcOffset = 512;
     constexpr std::int64_t kAgcStepsPerDb = 10;
-    constexpr std::int64_t kFloor_dbm = 106;
-    return (receiveAgc + kAgcOffset) / kAgcStepsPerDb - kFloor_dbm + ecio_db;
+    constexpr std::int64_t kFloorDbm = 106;
+    return (receiveAgc + kAgcOffset) / kAgcStepsPerDb - kFloorDbm + ecio_db;
 }
 
 } // namespace

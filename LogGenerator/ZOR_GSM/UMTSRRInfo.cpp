@@ -64,8 +64,8 @@ constexpr std::size_t kRawPowerOffset = 4;
 int transmitPower_dbm(std::int16_t raw) {
     constexpr int kRawOffset = 512;
     constexpr int kStepsPerDb = 10;
-    constexpr int kOffset_db = 70;
-    return (raw + kRawOffset) / kStepsPerDb - kOffset_db;
+    constexpr int kOffsetDb = 70;
+    return (raw + kRawOffset) / kStepsPerDb - kOffsetDb;
 }
 
 /// Over the entries that carry a power; not a number when none does.

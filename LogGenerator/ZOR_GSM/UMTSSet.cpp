@@ -18,8 +18,8 @@ constexpr std::size_t kCountOffset = 13;
 constexpr std::size_t kEntryLength = 10;
 
 constexpr NumberFormat kRealDb{"%f dB"};
-constexpr double kRscpOffset_db = -21.0;
-constexpr double kEnergyStep_db = 0.5;
+constexpr double kRscpOffsetDb = -21.0;
+constexpr double kEnergyStepDb = 0.5;
 
 constexpr std::string_view kScramblingCodeKey = "Scrambling Code";
 constexpr std::string_view kRscpKey = "RSCP";
@@ -27,8 +27,8 @@ constexpr std::string_view kEnergyKey = "Energy Per Chip";
 
 constexpr auto kEntryFields = std::to_array<Field>({
     {kScramblingCodeKey, u16At(2), Conversion::number()},
-    {kRscpKey, s8At(4), Conversion::number(kDecimalDb, 1.0, kRscpOffset_db)},
-    {kEnergyKey, s8At(7), Conversion::number(kRealDb, kEnergyStep_db)},
+    {kRscpKey, s8At(4), Conversion::number(kDecimalDb, 1.0, kRscpOffsetDb)},
+    {kEnergyKey, s8At(7), Conversion::number(kRealDb, kEnergyStepDb)},
     {"Downlink Frequency", s16At(0), Conversion::number()},
     {"Ranking Value", s16At(8), Conversion::number()},
     {"Rank Cell RSCP", s16At(5), Conversion::number(kDecimalDb)},

@@ -17,8 +17,8 @@ inline Record propertyListRecord(LogCode logCode, const PropertyList& object) {
     return bytes ? record.append(Bytes(*bytes)) : record;
 }
 
-/// The same with the property list already written, in the XML or the text form.
-inline Record propertyListRecord(LogCode logCode, std::string_view text) {
+/// A record that carries a text behind its header: a property list in the XML or the text form.
+inline Record textRecord(LogCode logCode, std::string_view text) {
     return Record(logCode).append(ByteBuffer(text.begin(), text.end()));
 }
 

@@ -93,7 +93,7 @@ TEST(UMTSRRInfoCellMonitor, ANumberThatIsNo32BitIntegerCountsAsMissing) {
 TEST(UMTSRRInfoCellMonitor, ABrokenPropertyListLogsTwoLinesAndChangesNothing) {
     // The text form, of which no beginning is a property list of its own.
     constexpr std::string_view kCells = "( { kHXCellMonitorCellId = 1; } )";
-    const ByteBuffer whole = propertyListRecord(kCellMonitor, kCells).bytes();
+    const ByteBuffer whole = textRecord(kCellMonitor, kCells).bytes();
     RecordFixture<UMTSRRInfo> fixture;
     fixture.feed(monitored(Array{serving(7, 8, 9)}));
     const PropertyList before = fixture.snapshot();

@@ -147,7 +147,7 @@ TEST(UMTSSetCellMonitor, ANumberThatIsNo32BitIntegerCountsAsMissing) {
 TEST(UMTSSetCellMonitor, ABrokenPropertyListEmptiesTheListAndLogsTwoLines) {
     // The text form, of which no beginning is a property list of its own.
     constexpr std::string_view kCells = "( { kHXCellMonitorUARFCN = 1; } )";
-    const ByteBuffer whole = propertyListRecord(kCellMonitor, kCells).bytes();
+    const ByteBuffer whole = textRecord(kCellMonitor, kCells).bytes();
     for (std::size_t length = 0; length < whole.size(); ++length) {
         RecordFixture<UMTSSet> fixture;
         fixture.list() = Array{"what was shown before"};
