@@ -18,12 +18,19 @@ Bytes LogPacketStripPrefix(Bytes data) {
         }
         return data;
     }
-    if (data.size() > kTransportPrefixLength) {
-        return data.subspan(kTransportPrefixLength);
+    const Bytes record = LogPacketRecord(data);
+    if (record.empty()) {
+        systemLog(LogPriority::Warning, "Packet length too small (len=%lu). Ignoring packet",
+                  data.size());
     }
-    systemLog(LogPriority::Warning, "Packet length too small (len=%lu). Ignoring packet",
-              data.size());
-    return {};
+    return record;
+}
+
+Bytes LogPacketRecord(Bytes data) {
+    if (data.empty() || data[0] != kTransportPrefix) {
+        return data;
+    }
+    return data.size() > kTransportPrefixLength ? data.subspan(kTransportPrefixLength) : Bytes();
 }
 
 LogCode LogPacketGetLogCode(const LogRecord& record) {

@@ -20,7 +20,14 @@ inline constexpr std::size_t kTransportPrefixLength = 2;
 ///   2            the log record
 Bytes LogPacketStripPrefix(Bytes data);
 
-/// The effective log code of a record of at least 5 bytes; checks neither length nor log type.
+/// The same without a line in the log, for whoever only looks at a message in passing.
+Bytes LogPacketRecord(Bytes data);
+
+/// The bytes of a record that hold log type and log code.
+inline constexpr std::size_t kLogCodeEnd = 5;
+
+/// The effective log code of a record of at least `kLogCodeEnd` bytes; checks neither length nor
+/// log type.
 LogCode LogPacketGetLogCode(const LogRecord& record);
 
 } // namespace pallax

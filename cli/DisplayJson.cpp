@@ -1,12 +1,13 @@
 #include "cli/DisplayJson.h"
 
-#include "cli/Utf8.h"
+#include "cli/Printable.h"
+#include "platform/Base64.h"
+#include "platform/Utf8.h"
 
 #include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
-#include <cstdint>
 
 namespace pallax {
 
@@ -44,7 +45,7 @@ void appendEscaped(std::string& out, std::string_view text) {
             out += text.front();
         } else if (static_cast<unsigned char>(text.front()) < kFirstBeyondAscii) {
             appendEscapedAscii(out, text.front());
-        } else if (const std::size_t length = utf8SequenceLength(text); length > 0) {
+        } else if (const std::size_t length = utf8At(text, 0).size; length > 0) {
             out += text.substr(0, length);
             taken = length;
         } else {
@@ -81,25 +82,6 @@ void appendReal(std::string& out, double number) {
     } else {
         out += "null";
     }
-}
-
-void appendBase64(std::string& out, Bytes bytes) {
-    constexpr std::string_view kDigits =
-        "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
-    constexpr std::size_t kGroup = 3;
-    out += '"';
-    for (std::size_t at = 0; at < bytes.size(); at += kGroup) {
-        const Bytes group = bytes.subspan(at, std::min(kGroup, bytes.size() - at));
-        std::uint32_t bits = 0;
-        for (std::size_t index = 0; index < kGroup; ++index) {
-            bits = (bits << 8U) | (index < group.size() ? group[index] : 0U);
-        }
-        for (std::size_t digit = 0; digit <= kGroup; ++digit) {
-            const std::uint32_t value = (bits >> (18U - 6U * digit)) & 0x3FU;
-            out += digit <= group.size() ? kDigits[value] : '=';
-        }
-    }
-    out += '"';
 }
 
 void appendValue(std::string& out, const PropertyList& object, int depth);
@@ -148,7 +130,9 @@ void appendValue(std::string& out, const PropertyList& object, int depth) {
         out += *object.boolean() ? "true" : "false";
         return;
     case Type::kData:
-        appendBase64(out, *object.data());
+        out += '"';
+        out += base64Text(*object.data());
+        out += '"';
         return;
     case Type::kDate:
         appendJsonString(out, isoDateText(*object.date()).value_or(dateText(*object.date())));

@@ -1,32 +1,18 @@
 #include "cli/FatalRecord.h"
 
+#include "LogGenerator/LogPacket.h"
 #include "platform/SystemLog.h"
 
 namespace pallax {
 
-namespace {
-
-constexpr std::uint8_t kPrefixMark = 0x81; // a prefix of two bytes, the second of no meaning
-constexpr std::size_t kPrefixLength = 2;
-constexpr std::size_t kHeaderLength = 13;
-constexpr std::uint8_t kStandardType = 1;
-constexpr std::uint8_t kExtendedType = 0xFF;
-constexpr std::size_t kCodeOffset = 3; // two bytes, little-endian
-constexpr std::uint32_t kExtendedCodes = 0xFF0000;
-
-} // namespace
-
-std::optional<std::uint32_t> logCodeOf(Bytes message) {
-    Bytes record = message;
-    if (record.size() > kPrefixLength && record[0] == kPrefixMark) {
-        record = record.subspan(kPrefixLength);
-    }
-    if (record.size() < kHeaderLength ||
-        (record[0] != kStandardType && record[0] != kExtendedType)) {
+std::optional<LogCode> logCodeOf(Bytes message) {
+    const LogRecord record(LogPacketRecord(message));
+    const std::uint8_t type = record.u8(0);
+    if (!record.has(LogRecord::kHeaderLength) ||
+        (type != LogRecord::kStandardType && type != LogRecord::kExtendedType)) {
         return std::nullopt;
     }
-    const std::uint32_t code = record[kCodeOffset] | std::uint32_t{record[kCodeOffset + 1]} << 8U;
-    return record[0] == kExtendedType ? kExtendedCodes | code : code;
+    return LogPacketGetLogCode(record);
 }
 
 std::string fatalRecordSentence(std::uint64_t packet, Bytes message, std::string_view reason) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/Records/LogCode.h"
 #include "platform/MessagePort.h"
 
 #include <cstdint>
@@ -17,7 +18,7 @@ enum class OnFatalRecord {
 };
 
 /// The effective log code of a message; nothing when it is no log record.
-std::optional<std::uint32_t> logCodeOf(Bytes message);
+std::optional<LogCode> logCodeOf(Bytes message);
 
 /// "packet 17 (log code 0xFF0000): SIM file data unreadable". Packets are counted from 1.
 std::string fatalRecordSentence(std::uint64_t packet, Bytes message, std::string_view reason);

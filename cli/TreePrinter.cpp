@@ -1,6 +1,6 @@
 #include "cli/TreePrinter.h"
 
-#include "cli/Utf8.h"
+#include "cli/Printable.h"
 #include "platform/Clock.h"
 
 namespace pallax {

@@ -56,7 +56,7 @@ ByteBuffer servingPlmnRecord(unsigned lac, unsigned rac) {
 
 ByteBuffer equivalentPlmnRecord() {
     // Entries stand 3 bytes apart and are read 6 bytes long.
-    return Record(0x7150).padTo(16).u8(2).append({2, 4, 6, 2, 2, 0, 2, 1, 0}).prefixed();
+    return Record(0x7150).padTo(16).u8(2).append({2, 0, 6, 2, 0, 3, 0, 1, 1}).prefixed();
 }
 
 ByteBuffer searcherRecord(const std::vector<UmtsCell>& cells) {

@@ -1,5 +1,6 @@
 #include "telephony/CodeFilter.h"
 
+#include "LogGenerator/LogPacket.h"
 #include "platform/PropertyList.h"
 
 #include <string_view>
@@ -8,10 +9,8 @@ namespace pallax {
 
 namespace {
 
-constexpr std::uint32_t kExtended = 0xFF0000;
-
-void addCodes(std::unordered_set<std::uint32_t>& codes, const Dictionary& command,
-              std::string_view key, std::uint32_t mark) {
+void addCodes(std::unordered_set<LogCode>& codes, const Dictionary& command, std::string_view key,
+              LogCode mark) {
     const PropertyList* value = command.find(key);
     const ArrayRef list = value != nullptr ? value->array() : nullptr;
     if (list == nullptr) {
@@ -19,7 +18,7 @@ void addCodes(std::unordered_set<std::uint32_t>& codes, const Dictionary& comman
     }
     for (const PropertyList& element : *list) {
         if (const auto code = element.int32()) {
-            codes.insert(static_cast<std::uint32_t>(*code) | mark);
+            codes.insert(static_cast<LogCode>(*code) | mark);
         }
     }
 }
@@ -34,7 +33,7 @@ std::optional<CodeFilter> CodeFilter::fromStartCommand(const Dictionary& command
     CodeFilter filter;
     filter._everything = everything;
     addCodes(filter._codes, command, "SetZorellLogCodes", 0);
-    addCodes(filter._codes, command, "SetHxExtraCodes", kExtended);
+    addCodes(filter._codes, command, "SetHxExtraCodes", kExtendedLogCodes);
     return filter;
 }
 
@@ -43,21 +42,9 @@ bool CodeFilter::wants(Bytes packet) const {
     return !code || _codes.contains(*code);
 }
 
-std::optional<std::uint32_t> effectiveCodeOf(Bytes packet) {
-    constexpr std::uint8_t kPrefixMark = 0x81;
-    constexpr std::size_t kPrefixSize = 2;
-    constexpr std::size_t kCodeAt = 3;
-    constexpr std::uint8_t kExtendedType = 0xFF;
-    constexpr unsigned kBitsPerByte = 8;
-    if (packet.size() >= kPrefixSize && packet.front() == kPrefixMark) {
-        packet = packet.subspan(kPrefixSize);
-    }
-    if (packet.size() < kCodeAt + 2) {
-        return std::nullopt;
-    }
-    const std::uint32_t high = packet[kCodeAt + 1];
-    const std::uint32_t code = packet[kCodeAt] | (high << kBitsPerByte);
-    return packet.front() == kExtendedType ? kExtended | code : code;
+std::optional<LogCode> effectiveCodeOf(Bytes packet) {
+    const LogRecord record(LogPacketRecord(packet));
+    return record.has(kLogCodeEnd) ? std::optional(LogPacketGetLogCode(record)) : std::nullopt;
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/Records/LogCode.h"
 #include "platform/Bytes.h"
 
 #include <cstdint>
@@ -24,10 +25,10 @@ public:
 
 private:
     bool _everything = false;
-    std::unordered_set<std::uint32_t> _codes; // effective
+    std::unordered_set<LogCode> _codes; // effective
 };
 
 /// The effective log code of a packet, transport prefix or not; nothing when it is too short.
-std::optional<std::uint32_t> effectiveCodeOf(Bytes packet);
+std::optional<LogCode> effectiveCodeOf(Bytes packet);
 
 } // namespace pallax

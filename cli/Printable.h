@@ -1,6 +1,5 @@
 #pragma once
 
-#include <cstddef>
 #include <string>
 #include <string_view>
 
@@ -9,10 +8,6 @@ namespace pallax {
 
 /// U+FFFD, which stands for a byte that is not part of valid UTF-8.
 inline constexpr std::string_view kReplacementCharacter = "\xEF\xBF\xBD";
-
-/// The bytes of the valid character that the text, which is not empty, starts with; 0 when its
-/// first byte starts none.
-std::size_t utf8SequenceLength(std::string_view text);
 
 /// Appends the text with each invalid byte replaced.
 void appendValidUtf8(std::string& out, std::string_view text);
