@@ -1,13 +1,16 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "cli/FatalRecord.h"
+#include "cli/Preconditions.h"
 #include "cli/Programs.h"
 #include "cli/ScopedLog.h"
 #include "cli/Settings.h"
+#include "cli/TeeSink.h"
 #include "cli/TreePrinter.h"
 #include "host/AsioMainQueue.h"
 #include "host/BuildBundle.h"
 #include "host/DirectoryResources.h"
 #include "host/LogSinks.h"
+#include "host/Recording.h"
 #include "host/SocketMessagePorts.h"
 #include "host/SourceClock.h"
 #include "host/WallClock.h"
@@ -16,6 +19,7 @@
 #include "telephony/ChildService.h"
 #include "telephony/SocketTelephonyService.h"
 
+#include <algorithm>
 #include <csignal>
 #include <memory>
 #include <sys/wait.h>
@@ -24,6 +28,9 @@
 namespace pallax {
 
 namespace {
+
+/// What the machine's log gets: failures. Every packet makes several lines of less urgency.
+constexpr int kSyslogLevel = static_cast<int>(LogPriority::Error);
 
 /// How often the connection and the child service are looked at.
 constexpr std::chrono::milliseconds kLookInterval{500};
@@ -57,7 +64,7 @@ public:
           _localPortName(child != nullptr ? child->privateName(PallaxModel::kLocalPortName)
                                           : std::string(PallaxModel::kLocalPortName)),
           _clock(_wallClock, _queue), _socketPorts(_queue, std::move(directory), &_clock),
-          _ports(_socketPorts, onFatalRecord),
+          _ports(_socketPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
           _telephony(_socketPorts, child != nullptr ? child->controlPortName()
                                                     : std::string(kTelephonyControlPort)),
           _resources(DirectoryResources::programFolder()), _notices(output),
@@ -116,27 +123,62 @@ private:
     PallaxModel _model;
 };
 
+/// Ends the child, and says what it had to complain of; true when that was nothing.
+bool endChild(ChildService& child) {
+    child.stop();
+    const std::string complaints = child.takeComplaints(); // lines that name the program
+    (void)!::write(STDERR_FILENO, complaints.data(), complaints.size());
+    return complaints.empty();
+}
+
 ExitStatus browse(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child) {
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     bool whole = false;
-    {
+    try {
         Browser browser(std::move(directory), onFatalRecord, child, output);
         whole = browser.run();
+    } catch (const FatalRecord&) {
+        output.flush(); // what was printed, and the generators' last words
+        if (child != nullptr) {
+            (void)endChild(*child);
+        }
+        throw;
     }
     output.flush();
     if (child == nullptr) {
         return kExitSuccess;
     }
-    child->stop();
-    const std::string complaints = child->takeComplaints(); // lines that name the program
-    (void)!::write(STDERR_FILENO, complaints.data(), complaints.size());
+    const bool contented = endChild(*child);
     if (!whole) {
         complain("The service that plays the recording has ended.");
     }
-    return whole && complaints.empty() ? kExitSuccess : kExitFailure;
+    return whole && contented ? kExitSuccess : kExitFailure;
+}
+
+/// Why the recording cannot be browsed although it can be read; nothing when it can, or when only
+/// its reader will find out (standard input is read once).
+std::optional<std::string> refusalOf(const std::string& path) {
+    if (path == "-") {
+        return std::nullopt;
+    }
+    const Recording::OpenResult recording = Recording::open(path);
+    if (!recording || (*recording)->technology() == nullptr) {
+        return std::nullopt; // the child service has the sentence for it
+    }
+    const std::string_view identifier = (*recording)->technology()->identifier;
+    for (const Technology& technology : technologies()) {
+        if (technology.identifier == identifier) {
+            return std::nullopt;
+        }
+    }
+    return noGeneratorSentence((*recording)->name(), identifier);
 }
 
 ExitStatus browseWithLog(const BrowseOptions& options, OnFatalRecord onFatalRecord) {
+    if (const auto refusal = options.recording ? refusalOf(*options.recording) : std::nullopt) {
+        complain(*refusal);
+        return kExitFailure;
+    }
     std::unique_ptr<ChildService> child;
     if (options.recording) {
         auto started = ChildService::start({*options.recording, options.play});
@@ -162,15 +204,20 @@ ExitStatus runBrowse(const BrowseOptions& options) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
+    if (const auto missing = missingTemplates()) {
+        complain(*missing);
+        return kExitFailure;
+    }
     const OnFatalRecord onFatalRecord =
         options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord;
-    if (options.logLevel) {
-        StderrSink sink;
-        const ScopedLog log(sink, *options.logLevel);
+    SyslogSink syslog("pallax");
+    if (!options.logLevel) {
+        const ScopedLog log(syslog, kSyslogLevel);
         return browseWithLog(options, onFatalRecord);
     }
-    SyslogSink sink("pallax");
-    const ScopedLog log(sink, static_cast<int>(LogPriority::Error));
+    StderrSink standardError;
+    TeeSink both(syslog, kSyslogLevel, standardError, *options.logLevel);
+    const ScopedLog log(both, std::max(kSyslogLevel, *options.logLevel));
     return browseWithLog(options, onFatalRecord);
 }
 

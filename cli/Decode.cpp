@@ -1,5 +1,6 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "cli/DroppedNotices.h"
+#include "cli/Preconditions.h"
 #include "cli/Programs.h"
 #include "cli/ScopedLog.h"
 #include "host/BuildBundle.h"
@@ -25,6 +26,10 @@ ExitStatus decodeTo(int descriptor, const DecodeOptions& options) {
 } // namespace
 
 ExitStatus runDecode(const DecodeOptions& options) {
+    if (const auto missing = missingTemplates()) {
+        complain(*missing);
+        return kExitFailure;
+    }
     if (!options.systemLog) {
         return decodeTo(STDOUT_FILENO, options);
     }

@@ -1,7 +1,7 @@
 #include "cli/DecodeCommand.h"
 
 #include "cli/FatalRecord.h"
-#include "platform/Format.h"
+#include "cli/Preconditions.h"
 
 namespace pallax {
 
@@ -11,7 +11,7 @@ std::unique_ptr<DisplayOutput> displayOutput(const DecodeOptions& options, Outpu
     if (options.format == DecodeFormat::Csv) {
         return std::make_unique<CsvOutput>(output);
     }
-    return std::make_unique<JsonOutput>(output, options.every);
+    return std::make_unique<JsonOutput>(output, options.chosenEvery());
 }
 
 } // namespace
@@ -46,10 +46,9 @@ ExitStatus DecodeCommand::decode(Recording& recording, DisplayOutput& output) {
         _report(recording.foreignLinkType().sentence);
         return kExitFailure;
     }
-    RecordingDecoder decoder(_environment, technology->identifier, _options.every, output);
+    RecordingDecoder decoder(_environment, technology->identifier, _options.chosenEvery(), output);
     if (!decoder.hasGenerator()) {
-        _report(formatText("%@: there is no log generator for the technology %@.",
-                           {recording.name(), technology->identifier}));
+        _report(noGeneratorSentence(recording.name(), technology->identifier));
         return kExitFailure;
     }
     return decodePackets(recording, decoder);

@@ -18,10 +18,15 @@ struct DecodeOptions {
     std::vector<std::string> recordings;
     /// What to take every recording for, whatever its link type says.
     const RecordedTechnology* technology = nullptr;
-    Every every = Every::End;
+    /// Nothing: the last display, or in CSV, which tells what changes, every tick.
+    std::optional<Every> every;
     DecodeFormat format = DecodeFormat::Json;
     std::optional<std::string> systemLog; ///< path of a text file
     bool strict = false;
+
+    Every chosenEvery() const {
+        return every.value_or(format == DecodeFormat::Csv ? Every::Tick : Every::End);
+    }
 };
 
 /// `pallax decode`: recordings to JSON or CSV, in the order of the command line, each with a

@@ -28,7 +28,9 @@ MessagePorts::Local GuardedMessagePorts::createLocal(std::string_view name,
         // The callback may destroy the port, and with it this closure: nothing of it is touched
         // once the callback has been called.
         GuardedMessagePorts* const self = this;
-        const std::uint64_t packet = identifier == 0 ? ++_packets : _packets;
+        const std::uint64_t counted = identifier == 0 ? ++_packets : _packets;
+        const std::uint32_t told = _packetNumber ? _packetNumber() : 0;
+        const std::uint64_t packet = told != 0 ? told : counted;
         try {
             return receive(identifier, data);
         } catch (const std::exception& error) {

@@ -4,6 +4,7 @@
 #include "platform/MessagePort.h"
 
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <stdexcept>
 #include <string>
@@ -30,12 +31,17 @@ public:
 };
 
 /// Message ports whose receive callbacks may throw: counts the packets (messages of identifier
-/// 0, over all local ports) and turns an exception into FatalRecord, which leaves through
-/// whoever runs the main queue, or with Skip into a line of the system log. It outlives its ports.
+/// 0, over all local ports) where the source does not number them, and turns an exception into
+/// FatalRecord, which leaves through whoever runs the main queue, or with Skip into a line of the
+/// system log. It outlives its ports.
 class GuardedMessagePorts final : public MessagePorts {
 public:
-    GuardedMessagePorts(MessagePorts& ports, OnFatalRecord onFatalRecord)
-        : _ports(ports), _onFatalRecord(onFatalRecord) {}
+    /// The number of the packet being delivered as its source counts, or 0.
+    using PacketNumber = std::function<std::uint32_t()>;
+
+    GuardedMessagePorts(MessagePorts& ports, OnFatalRecord onFatalRecord,
+                        PacketNumber packetNumber = {})
+        : _ports(ports), _onFatalRecord(onFatalRecord), _packetNumber(std::move(packetNumber)) {}
 
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override {
@@ -47,6 +53,7 @@ private:
 
     MessagePorts& _ports;
     OnFatalRecord _onFatalRecord;
+    PacketNumber _packetNumber;
     std::uint64_t _packets = 0;
 };
 

@@ -85,7 +85,7 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
                  "Drop a record that cannot be read instead of ending with status 70");
     app.add_option("--log-level", options.logLevel,
                    "Write system-log lines up to this priority to standard error")
-        ->check(CLI::Range(0, kHighestLevel))
+        ->check(CLI::Range(0, kHighestLevel).name(""))
         ->type_name("0-7");
 }
 
@@ -96,9 +96,10 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
     }
     addChoice(app, "--technology", options.technology, technologies,
               "What the recordings are of (otherwise their link type tells)");
-    addChoice<Every>(app, "--every", options.every,
-                     {{"end", Every::End}, {"tick", Every::Tick}, {"packet", Every::Packet}},
-                     "When the display is written (default: end)");
+    addChoice<std::optional<Every>>(
+        app, "--every", options.every,
+        {{"end", Every::End}, {"tick", Every::Tick}, {"packet", Every::Packet}},
+        "When the display is written (default: end; for csv, tick)");
     addChoice<DecodeFormat>(app, "--format", options.format,
                             {{"json", DecodeFormat::Json}, {"csv", DecodeFormat::Csv}},
                             "JSON, one object a line, or CSV (default: json)");
@@ -137,8 +138,22 @@ ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
     return wrongUsage(error.what());
 }
 
+bool loopsStandardInput(std::string_view recording, const PlayOptions& play) {
+    return play.loop && recording == "-";
+}
+
+/// Help pages without the library's marks for what an option demands.
+class PlainFormatter final : public CLI::Formatter {
+public:
+    std::string make_option_opts(const CLI::Option* option) const override {
+        const std::string type = option->get_type_name();
+        return type.empty() ? "" : " " + type;
+    }
+};
+
 /// The help and version flags that every command has.
 void prepare(CLI::App& app) {
+    app.formatter(std::make_shared<PlainFormatter>());
     app.set_help_flag("-h,--help", "Show this help and exit");
     app.set_version_flag("--version", kVersionText, "Show the version and exit");
 }
@@ -173,6 +188,10 @@ ParsedOptions parseOptions(std::vector<std::string> arguments) {
             return wrongUsage("the command \"" + command->get_name() +
                               "\" must come first, without options before it");
         }
+    }
+    if (loopsStandardInput(browse.recording.value_or(""), browse.play) ||
+        loopsStandardInput(service.recording, service.play)) {
+        return wrongUsage("standard input can be played only once, not with --loop");
     }
     if (decodeApp->parsed()) {
         return decode;

@@ -35,8 +35,9 @@ private:
     Time _now;
 };
 
-/// Decodes the packets of one recording by driving its generator directly, with the display ticks
-/// that a viewer would have seen. What it keeps does not grow with the recording.
+/// Decodes the packets of one recording by driving its generator directly. Its display ticks lie
+/// on the grid of a viewer's, but it sees every packet of the recording, a viewer only those that
+/// its start command asked for. What it keeps does not grow with the recording.
 class RecordingDecoder {
 public:
     /// Packet bytes after which the display is generated although no tick has passed, for a

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "monitor/PallaxModel.h"
 #include "platform/Date.h"
 
 #include <chrono>
@@ -12,7 +13,7 @@ namespace pallax {
 /// All is reckoned, nothing is stepped: a gap of years costs as much as one of seconds.
 class TickGrid {
 public:
-    static constexpr std::chrono::nanoseconds kInterval = std::chrono::seconds(2);
+    static constexpr std::chrono::nanoseconds kInterval = PallaxModel::kDisplayInterval;
 
     struct Tick {
         std::uint64_t number;

@@ -59,7 +59,7 @@ HeaderBytes encodeHeader(const FrameHeader& header, std::size_t length) {
     const std::int64_t time =
         header.sourceTime ? header.sourceTime->time_since_epoch().count() : kNoTime;
     put(bytes, kTimeAt, static_cast<std::uint64_t>(time));
-    put(bytes, kRequestAt, header.requestNumber);
+    put(bytes, kRequestAt, header.number);
     return bytes;
 }
 
@@ -130,7 +130,7 @@ void PortFrameParser::decodeHeader() {
     FrameHeader& header = _frame.header;
     header.kind = static_cast<FrameKind>(kind);
     header.identifier = static_cast<std::int32_t>(get<std::uint32_t>(_headerBytes, kIdentifierAt));
-    header.requestNumber = get<std::uint32_t>(_headerBytes, kRequestAt);
+    header.number = get<std::uint32_t>(_headerBytes, kRequestAt);
     const auto time = static_cast<std::int64_t>(get<std::uint64_t>(_headerBytes, kTimeAt));
     header.sourceTime =
         time == kNoTime ? std::nullopt : std::optional(Time(std::chrono::nanoseconds(time)));

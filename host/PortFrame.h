@@ -18,7 +18,8 @@
 ///   8       4      message identifier, signed
 ///   12      4      length of the data that follows the header, at most 16 MiB
 ///   16      8      source time: signed nanoseconds since the epoch; the smallest number: none
-///   24      4      request number: a reply carries that of its request; otherwise zero
+///   24      4      number: a reply carries that of its request; a message that of its packet in
+///                  the source, counted from 1 (0: not told); otherwise zero
 ///   28      4      reserved, zero
 ///
 /// A peer that sends anything else is cut off.
@@ -40,7 +41,7 @@ inline constexpr std::size_t kLargestMessage = std::size_t{16} << 20U;
 struct FrameHeader {
     FrameKind kind = FrameKind::Message;
     std::int32_t identifier = 0;
-    std::uint32_t requestNumber = 0;
+    std::uint32_t number = 0;
     std::optional<Time> sourceTime;
 
     friend bool operator==(const FrameHeader&, const FrameHeader&) = default;

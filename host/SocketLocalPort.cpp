@@ -175,6 +175,11 @@ void SocketLocalPort::Session::handle(const std::shared_ptr<State>& port) {
     _frame.reset();
     switch (frame.header.kind) {
     case FrameKind::Message:
+        if (times != nullptr) {
+            times->packetNumber(frame.header.number);
+        }
+        deliver(port, frame);
+        return;
     case FrameKind::Request:
         deliver(port, frame);
         return;
@@ -220,7 +225,7 @@ void SocketLocalPort::Session::answer(const PortFrame& request,
     FrameHeader header;
     header.kind = fits ? FrameKind::Reply : FrameKind::NoReply;
     header.identifier = request.header.identifier;
-    header.requestNumber = request.header.requestNumber;
+    header.number = request.header.number;
     _answer.clear();
     _answered = 0;
     appendFrame(_answer, header, fits ? Bytes(*reply) : Bytes());

@@ -102,7 +102,7 @@ bool SocketRemotePort::State::takeFrame(PortFrame frame) {
     if (kind != FrameKind::Reply && kind != FrameKind::NoReply) {
         return false;
     }
-    if (frame.header.requestNumber == requestNumber) {
+    if (frame.header.number == requestNumber) {
         reply = std::move(frame);
     }
     return true;
@@ -229,7 +229,7 @@ RemoteMessagePort::Outcome SocketRemotePort::sendRequest(const Request& request)
     FrameHeader header;
     header.kind = request.awaitReply ? FrameKind::Request : FrameKind::Message;
     header.identifier = request.identifier;
-    header.requestNumber = request.awaitReply ? ++state.requestNumber : 0;
+    header.number = request.awaitReply ? ++state.requestNumber : 0;
     state.reply.reset();
     const auto bytes = encodeHeader(header, request.data.size());
     const SendError error = state.send(bytes, request.data, deadlineIn(request.sendTimeout));

@@ -45,7 +45,11 @@ public:
 
     void sourceBegan() override;
     bool advance(Time time) override;
+    void packetNumber(std::uint32_t number) override { _packetNumber = number; }
     void sourceEnded() override;
+
+    /// The number of the latest packet in its source, counted from 1; 0 when it is not told.
+    std::uint32_t packetNumber() const { return _packetNumber; }
 
 private:
     class Timer;
@@ -59,6 +63,7 @@ private:
     std::function<void()> _ended;
     std::optional<Time> _first; ///< of this connection
     std::optional<Time> _now;
+    std::uint32_t _packetNumber = 0;
     std::optional<std::chrono::steady_clock::time_point> _heard;
     std::list<std::weak_ptr<TimerState>> _timers; ///< in the order of their scheduling
 };

@@ -2,6 +2,8 @@
 
 #include "platform/Date.h"
 
+#include <cstdint>
+
 namespace pallax {
 
 /// Hears the source times that arrive on a local port, in order.
@@ -14,6 +16,9 @@ public:
     /// posted on the main queue comes first, then this is to be called again from a later block.
     /// False: the clock stands at `time`.
     virtual bool advance(Time time) = 0;
+    /// The message that is delivered next is that packet of its source, counted from 1; 0 when
+    /// the source does not say.
+    virtual void packetNumber(std::uint32_t number) = 0;
     /// The source has come to its end.
     virtual void sourceEnded() = 0;
 };

@@ -71,7 +71,7 @@ void PallaxModel::startMonitor() {
         logError("No log generator technology works");
         return retryLater();
     }
-    const auto command = serializeXml(_logGenerator->getStartCommand());
+    const auto command = _platform.serialize(_logGenerator->getStartCommand());
     if (!command) {
         logError(" Could not generate PLIST");
         return retryLater();
@@ -163,7 +163,7 @@ void PallaxModel::destroyPorts() {
 }
 
 void PallaxModel::configureGenerator() {
-    const auto query = serializeXml(Dictionary{{kTechnologyKey, kTechnologyKey}});
+    const auto query = _platform.serialize(Dictionary{{kTechnologyKey, kTechnologyKey}});
     if (!query) {
         logError(" Could not generate GetTechnology command; cannot configure");
         return;
@@ -233,7 +233,7 @@ void PallaxModel::refresh() {
 }
 
 NodeRef PallaxModel::topLevelNodes() {
-    if (_nodes) {
+    if (_nodes || _nodesByPath) { // paths without a root: the display was asked for, and is null
         return _nodes;
     }
     if (!_logGenerator) {

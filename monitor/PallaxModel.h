@@ -4,6 +4,7 @@
 #include "app/tree/PallaxModelNode.h"
 #include "platform/MessagePort.h"
 #include "platform/PropertyList.h"
+#include "platform/PropertyListCodec.h"
 #include "platform/RepeatingTimer.h"
 
 #include <chrono>
@@ -44,6 +45,8 @@ public:
         ModelObserver& observer;
         std::string_view localPortName = kLocalPortName;
         std::chrono::nanoseconds retryDelay = kRetryDelay;
+        /// How commands are written.
+        Result<std::string, CodecError> (*serialize)(const PropertyList&) = serializeXml;
     };
 
     explicit PallaxModel(const Platform& platform);

@@ -21,6 +21,29 @@ struct NumberConversion {
     std::size_t size = 0; ///< characters of the format text that it takes, "%" included
 };
 
+/// Sets what a flag character of a conversion asks for; false when it is none.
+constexpr bool takeFlag(NumberConversion& conversion, char flag) {
+    switch (flag) {
+    case '-':
+        conversion.leftAlign = true;
+        return true;
+    case '+':
+        conversion.plusSign = true;
+        return true;
+    case '0':
+        conversion.zeroPad = true;
+        return true;
+    case ' ':
+        conversion.blankSign = true;
+        return true;
+    case '#':
+        conversion.alternate = true;
+        return true;
+    default:
+        return false;
+    }
+}
+
 /// Reads the conversion that starts at the "%" at `start`. Throws std::invalid_argument (a
 /// compile error in a constant expression) on a conversion that this project does not use.
 constexpr NumberConversion parseConversion(std::string_view format, std::size_t start) {
@@ -39,28 +62,8 @@ constexpr NumberConversion parseConversion(std::string_view format, std::size_t 
         }
         return value;
     };
-    for (bool flag = true; flag;) {
-        switch (peek()) {
-        case '-':
-            result.leftAlign = true;
-            break;
-        case '+':
-            result.plusSign = true;
-            break;
-        case '0':
-            result.zeroPad = true;
-            break;
-        case ' ':
-            result.blankSign = true;
-            break;
-        case '#':
-            result.alternate = true;
-            break;
-        default:
-            flag = false;
-            break;
-        }
-        at += flag ? 1U : 0U;
+    while (takeFlag(result, peek())) {
+        ++at;
     }
     result.width = number();
     if (peek() == '.') {

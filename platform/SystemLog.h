@@ -33,10 +33,12 @@ public:
     /// `sink` may be null; it must outlive its use. Not for use from several threads at once.
     static void setSink(LogSink* sink, int threshold = kEverything);
 
-    static bool isEnabled(LogPriority priority) {
-        constexpr int kLevelBits = 7;
-        return (static_cast<int>(priority) & kLevelBits) <= _threshold;
+    /// How urgent a priority is, from 0 (most) to 7.
+    static constexpr int levelOf(LogPriority priority) {
+        constexpr unsigned kLevelBits = 7;
+        return static_cast<int>(static_cast<unsigned>(priority) & kLevelBits);
     }
+    static bool isEnabled(LogPriority priority) { return levelOf(priority) <= _threshold; }
     static void write(LogPriority priority, std::string_view text);
 
 private:

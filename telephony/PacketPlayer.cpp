@@ -74,6 +74,7 @@ PacketPlayer::Progress PacketPlayer::fetch() {
         return startRound();
     }
     _packet = next.packet;
+    ++_packetNumber;
     if (!_first) {
         _first = _last = _packet->time;
         _started = _setup.steadyNow();
@@ -91,6 +92,7 @@ PacketPlayer::Progress PacketPlayer::fetch() {
 PacketPlayer::Progress PacketPlayer::startRound() {
     const bool empty = _newRound; // a round without packets would go round for ever
     _newRound = true;
+    _packetNumber = 0;
     _sourceEnded = empty || !_setup.options.loop || !_setup.source.failure().empty() ||
                    !_setup.source.restart();
     return Progress::Go;
@@ -100,6 +102,7 @@ void PacketPlayer::sendPacket() {
     if (_filter->wants(_packet->data)) {
         FrameHeader header;
         header.sourceTime = _packet->time;
+        header.number = _packetNumber;
         _setup.sink.write(header, _packet->data);
     }
     _packet.reset();

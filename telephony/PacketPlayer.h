@@ -72,6 +72,7 @@ private:
     Setup _setup;
     std::optional<CodeFilter> _filter;
     std::optional<PacketSource::Packet> _packet; // fetched, not yet sent; its time is shifted
+    std::uint32_t _packetNumber = 0;             // of that packet in the source, from 1
     std::optional<Time> _first;                  // source time of the very first packet
     Time _last;                                  // the latest source time of a packet
     std::chrono::nanoseconds _shift{0};          // of this round's stamps

@@ -93,6 +93,7 @@ PallaxProcess::PallaxProcess(const World& world, const std::vector<std::string>&
     words.insert(words.end(), arguments.begin(), arguments.end());
     std::vector<std::string> environment{"XDG_RUNTIME_DIR=" + world.folder().string(),
                                          "XDG_CONFIG_HOME=" + world.path("config"), "TZ=UTC"};
+    environment.insert(environment.end(), world.environment.begin(), world.environment.end());
     posix_spawn_file_actions_t files;
     ::posix_spawn_file_actions_init(&files);
     ::posix_spawn_file_actions_addopen(&files, STDIN_FILENO, input.c_str(), O_RDONLY, 0);

@@ -24,6 +24,9 @@ public:
     /// The sockets there are now, sorted.
     std::vector<std::string> sockets() const;
 
+    /// More of the environment that programs in it see, NAME=VALUE.
+    std::vector<std::string> environment;
+
 private:
     std::filesystem::path _folder;
 };

@@ -43,7 +43,7 @@ std::string faultWith(std::size_t offset, std::uint8_t value) {
 
 TEST(PortFrame, AHeaderIsLaidOutAsDocumented) {
     FrameHeader header = headerOf(FrameKind::Request, -2);
-    header.requestNumber = 0x01020304;
+    header.number = 0x01020304;
     header.sourceTime = Time(std::chrono::nanoseconds(0x1122334455667788));
     const std::array<std::uint8_t, kFrameHeaderSize> expected = {
         'P',  'L',  'X',  'M',                          // magic

@@ -104,14 +104,14 @@ protected:
     RecordingLog log;
     Outcome reply = technology("Fake");
     Outcome startOutcome;
-    std::unique_ptr<PallaxModel> model = std::make_unique<PallaxModel>(
-        PallaxModel::Platform{.ports = ports,
-                              .telephony = telephony,
-                              .queue = queue,
-                              .timers = queue,
-                              .generators = {clock, resources, bundle, standardOutput},
-                              .technologies = kFakeTechnologies,
-                              .observer = observer});
+    PallaxModel::Platform platform{.ports = ports,
+                                   .telephony = telephony,
+                                   .queue = queue,
+                                   .timers = queue,
+                                   .generators = {clock, resources, bundle, standardOutput},
+                                   .technologies = kFakeTechnologies,
+                                   .observer = observer};
+    std::unique_ptr<PallaxModel> model = std::make_unique<PallaxModel>(platform);
 };
 
 } // namespace pallax::doubles

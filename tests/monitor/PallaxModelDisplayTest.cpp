@@ -99,12 +99,15 @@ TEST_F(PallaxModelDisplayTest, APacketWithoutAGeneratorIsLostAndStillCountsAsNew
     EXPECT_EQ(observer.updates, 1);
 }
 
-TEST_F(PallaxModelDisplayTest, AGeneratorWithoutADisplayGivesNoTreeAndIsAskedAgain) {
+TEST_F(PallaxModelDisplayTest, AGeneratorWithoutADisplayGivesNoTreeAndIsAskedOnceATick) {
     start();
+    EXPECT_EQ(model->topLevelNodes(), nullptr);
     EXPECT_EQ(model->topLevelNodes(), nullptr);
     EXPECT_EQ(model->nodeAtPath("/"), nullptr); // the paths are there, and empty
     EXPECT_EQ(generator().displaysMade, 1);
     generator().display = Dictionary{};
+    ports.deliver({1});
+    queue.advance(2s);
     EXPECT_NE(model->topLevelNodes(), nullptr);
     EXPECT_EQ(generator().displaysMade, 2);
     EXPECT_NE(model->nodeAtPath("/"), nullptr);

@@ -179,6 +179,19 @@ TEST_F(PallaxModelFailureTest, AGeneratorOfAnEarlierAttemptStaysWhenALaterQueryF
     EXPECT_EQ(ports.requests.back().data, xml(Dictionary{{"Start", "Fake"}}));
 }
 
+TEST_F(PallaxModelFailureTest, AQueryThatCannotBeWrittenLeavesTheGeneratorUnset) {
+    platform.serialize = [](const PropertyList&) -> Result<std::string, CodecError> {
+        return CodecError{0, "nothing can be written today"};
+    };
+    model = std::make_unique<PallaxModel>(platform);
+    start();
+    EXPECT_EQ(errors(),
+              (Diary{createdPorts(), " Could not generate GetTechnology command; cannot configure",
+                     "No log generator technology works"}));
+    EXPECT_TRUE(ports.requests.empty());
+    expectTeardownAndRetry();
+}
+
 TEST_F(PallaxModelFailureTest, AStartCommandThatIsNoPropertyListFailsTheStart) {
     reply = technology("Mute");
     start();

@@ -67,10 +67,9 @@ TEST(NumberFormat, UnitIsTheTextBehindTheNumber) {
 
 TEST(NumberFormat, ACommaLocaleChangesNothing) {
     const std::string before = std::setlocale(LC_ALL, nullptr);
-    // The locale is there on machines that have it; std::setlocale says so.
-    if (std::setlocale(LC_ALL, "de_DE.UTF-8") != nullptr) {
-        EXPECT_EQ(printed("%.1f", 0.5), "0,5") << "the locale has a comma";
-    }
+    // The build makes the locale and LOCPATH names its folder.
+    ASSERT_NE(std::setlocale(LC_ALL, "de_DE.UTF-8"), nullptr);
+    EXPECT_EQ(printed("%.1f", 0.5), "0,5") << "the locale has a comma";
     EXPECT_EQ(DisplayNumber(-94.75, kLevel).text(), "-94.75 dBm");
     EXPECT_EQ(formatText("Measured RSSI: %lf\n", {-75.5}), "Measured RSSI: -75.500000\n");
     (void)std::setlocale(LC_ALL, before.c_str());
