@@ -32,4 +32,8 @@ std::vector<SamplePacket> gsmAttachPackets();
 /// behind a hill, neighbours that come and go.
 std::vector<SamplePacket> umtsDrivePackets();
 
+/// Two minutes of an LTE phone in a car: idle and connected mode, handovers, neighbours of every
+/// technology.
+std::vector<SamplePacket> lteDrivePackets();
+
 } // namespace pallax

@@ -1,0 +1,61 @@
+#include "LogGenerator/LTE/MeasuredNeighborCells.h"
+
+#include "LogGenerator/LTE/SharedLTERecords.h"
+#include "LogGenerator/Records/EntryList.h"
+#include "platform/SystemLog.h"
+
+#include <array>
+
+namespace pallax {
+
+namespace {
+
+constexpr auto kLogCodes = std::to_array<LogCode>({kConnectedModeLogCode});
+
+constexpr EntryList::Layout kNeighbours{
+    .start = kConnectedModeLength, .stride = kMeasuredEntryLength, .bytesRead = 6};
+
+constexpr auto kNeighbourFields = std::to_array<Field>({
+    {"Physical Cell ID", u16At(0), Conversion::number()},
+    {"Filtered RSRP", u16At(2), Conversion::number(kLevelDbm, 0.25, -140.0)},
+    {"Filtered RSRQ", u16At(4), Conversion::number(kLevelDb, 0.125, -20.0)},
+});
+
+/// Whether the record claims entries and seems to have room for them; logs why not.
+bool sizeIsExpected(const LogRecord& record) {
+    const std::size_t count = record.u8(kMeasuredCountOffset);
+    const std::size_t detectedLength = kDetectedEntryLength * record.u8(kDetectedCountOffset);
+    const auto expected = static_cast<std::uint8_t>(count * kMeasuredEntryLength);
+    const auto actual = static_cast<std::uint8_t>(record.length() - detectedLength);
+    if (count == 0 || expected > actual) {
+        systemLog(LogPriority::Error, "Unexpected log packet bytes size: expected=%d actual=%d",
+                  expected, actual);
+        return false;
+    }
+    return true;
+}
+
+} // namespace
+
+std::span<const LogCode> MeasuredNeighborCells::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+void MeasuredNeighborCells::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Warning, "Measured Neighbor Cells");
+    if (logCode != kConnectedModeLogCode) {
+        return logUnknown(logCode);
+    }
+    if (!record.has(kConnectedModeLength)) {
+        return;
+    }
+    clearList();
+    if (sizeIsExpected(record)) {
+        const EntryList neighbours(record, kNeighbours, record.u8(kMeasuredCountOffset));
+        replaceList(neighbours.map([](const LogRecord& entry, std::size_t /*index*/) {
+            return entryOf(kNeighbourFields, entry);
+        }));
+    }
+}
+
+} // namespace pallax

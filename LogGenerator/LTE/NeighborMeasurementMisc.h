@@ -1,0 +1,22 @@
+#pragma once
+
+#include "LogGenerator/Records/Base.h"
+
+namespace pallax {
+
+/// The idle-mode measurement of neighbours, section "Neighbor Measurements": the fixed part of the
+/// record whose list NeighborCellsList shows.
+///
+///   0xB180, at least 21 bytes, bit-packed
+///   byte  bit  width  key        shown as
+///   13    0    8      Version    number
+///   17    0    16     E-ARFCN    number
+///   19    0    6      Qrxlevmin  raw x 2 - 140, dBm
+class NeighborMeasurementMisc final : public Base {
+public:
+    std::string_view getSectionName() const override { return "Neighbor Measurements"; }
+    std::span<const LogCode> getLogCodeArray() const override;
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
+};
+
+} // namespace pallax
