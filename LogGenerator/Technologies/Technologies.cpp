@@ -1,5 +1,6 @@
 #include "LogGenerator/Technologies/Technologies.h"
 
+#include "LogGenerator/UTRAN/UTRANLogGenerator.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMLogGenerator.h"
 #include "platform/TelephonyConstants.h"
 
@@ -10,6 +11,7 @@ namespace pallax {
 std::span<const Technology> technologies() {
     static constexpr auto kTechnologies = std::to_array<Technology>({
         {kHXLogChannelTechnology_Zorell_GSM, ZOR_GSMLogGenerator::generator},
+        {kHXLogChannelTechnology_Zorell_UTRAN2, UTRANLogGenerator::generator},
     });
     return kTechnologies;
 }
