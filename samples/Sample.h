@@ -32,4 +32,8 @@ std::vector<SamplePacket> gsmAttachPackets();
 /// behind a hill, neighbours that come and go.
 std::vector<SamplePacket> umtsDrivePackets();
 
+/// Two minutes of a UTRAN phone in a car: a data session on its own channel that ends over the
+/// shared and the paging states, two cell changes, neighbours that come and go.
+std::vector<SamplePacket> utranDrivePackets();
+
 } // namespace pallax

@@ -1,8 +1,5 @@
+#include "samples/Drive.h"
 #include "samples/DriveRecords.h"
-#include "samples/Sample.h"
-
-#include <algorithm>
-#include <cstdlib>
 
 namespace pallax {
 
@@ -15,31 +12,6 @@ constexpr int kToUmts = 92;
 
 constexpr unsigned kLocationArea = 0x1A2B;
 constexpr unsigned kUarfcn = 10713;
-
-/// From `least` up to `largest` and back, once in `period` seconds.
-int wave(int second, int period, int least, int largest) {
-    const int half = period / 2;
-    const int place = std::abs(second % period - half);
-    return least + (largest - least) * (half - place) / half;
-}
-
-/// The packets of the drive as they come to mind; sorted by time at the end.
-class Drive {
-public:
-    void add(int milliseconds, ByteBuffer data) {
-        _packets.push_back(
-            {kSampleStart + std::chrono::milliseconds(milliseconds), std::move(data)});
-    }
-    std::vector<SamplePacket> inOrder() {
-        std::stable_sort(
-            _packets.begin(), _packets.end(),
-            [](const SamplePacket& a, const SamplePacket& b) { return a.time < b.time; });
-        return std::move(_packets);
-    }
-
-private:
-    std::vector<SamplePacket> _packets;
-};
 
 bool onGsm(int second) {
     return second >= kToGsm && second < kToUmts;

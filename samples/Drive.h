@@ -1,0 +1,37 @@
+#pragma once
+
+#include "samples/Sample.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <utility>
+
+/// What the samples of a phone in a car share.
+namespace pallax {
+
+/// From `least` up to `largest` and back, once in `period` seconds.
+inline int wave(int second, int period, int least, int largest) {
+    const int half = period / 2;
+    const int place = std::abs(second % period - half);
+    return least + (largest - least) * (half - place) / half;
+}
+
+/// The packets of a drive as they come to mind; sorted by time at the end.
+class Drive {
+public:
+    void add(int milliseconds, ByteBuffer data) {
+        _packets.push_back(
+            {kSampleStart + std::chrono::milliseconds(milliseconds), std::move(data)});
+    }
+    std::vector<SamplePacket> inOrder() {
+        std::stable_sort(
+            _packets.begin(), _packets.end(),
+            [](const SamplePacket& a, const SamplePacket& b) { return a.time < b.time; });
+        return std::move(_packets);
+    }
+
+private:
+    std::vector<SamplePacket> _packets;
+};
+
+} // namespace pallax
