@@ -1,6 +1,5 @@
 // Nanoseconds that one packet costs each record class, with a section attached and no log sink.
 
-#include "LogGenerator/LogPacket.h"
 #include "LogGenerator/ZOR_GSM/ActiveSet.h"
 #include "LogGenerator/ZOR_GSM/BLER.h"
 #include "LogGenerator/ZOR_GSM/DetectedSet.h"
@@ -13,42 +12,14 @@
 #include "LogGenerator/ZOR_GSM/UMTSRRInfo.h"
 #include "LogGenerator/ZOR_GSM/UMTSSet.h"
 #include "LogGenerator/ZOR_GSM/VirtualActiveSet.h"
+#include "bench/MeasureRecord.h"
 #include "platform/PropertyListCodec.h"
 #include "platform/TelephonyConstants.h"
-#include "tests/doubles/RecordBuilder.h"
-
-#include <benchmark/benchmark.h>
 
 #include <string_view>
 
 namespace pallax {
 namespace {
-
-using doubles::Record;
-
-template <class RecordClass, Record (*makePacket)()>
-void measure(benchmark::State& state) {
-    ClassDict classDict;
-    CodeDict codeDict;
-    RecordClass record;
-    record.initWithDict(classDict, codeDict);
-    const bool list = record.sectionKind() == SectionKind::List;
-    record.updateSectionRef(list ? PropertyList(Array()) : PropertyList(Dictionary()));
-    const ByteBuffer bytes = makePacket().bytes();
-    const LogRecord packet{Bytes(bytes)};
-    const LogCode logCode = LogPacketGetLogCode(packet);
-    for ([[maybe_unused]] const auto iteration : state) {
-        record.updateWithData(packet, logCode);
-        benchmark::ClobberMemory();
-    }
-    state.SetItemsProcessed(state.iterations());
-}
-
-/// Nothing but zeros behind the header.
-template <LogCode logCode, std::size_t length>
-Record zeros() {
-    return Record(logCode).padTo(length);
-}
 
 /// Twelve cells of the searcher, three of them active.
 Record searcherCells() {

@@ -6,7 +6,6 @@
 #include <cstdlib>
 #include <utility>
 
-/// What the samples of a phone in a car share.
 namespace pallax {
 
 /// From `least` up to `largest` and back, once in `period` seconds.
