@@ -69,6 +69,13 @@ public:
                             const GeneratorEnvironment& environment);
 
 protected:
+    /// Marks a generator whose parts are missing: its making is not logged, and what its class
+    /// builds up is left out.
+    struct WithoutParts {};
+    static constexpr WithoutParts kWithoutParts{};
+    LogGenerator(const GeneratorEnvironment& environment, WithoutParts /*unused*/)
+        : _environment(environment) {}
+
     const GeneratorEnvironment& environment() const { return _environment; }
 
 private:

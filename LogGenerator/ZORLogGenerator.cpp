@@ -83,6 +83,9 @@ std::optional<ByteBuffer> ZORLogGenerator::generateDlfFromState(const Dictionary
 }
 
 PropertyList ZORLogGenerator::getSaveContentsFromState(const Dictionary& state) const {
+    if (_binData == nullptr) {
+        return {};
+    }
     Array contents = historyOf(state);
     if (auto log = generateDlfFromState(state)) {
         Dictionary entry;

@@ -22,13 +22,17 @@ public:
     PropertyList getSaveContentsFromState(const Dictionary& state) const override;
 
 protected:
+    /// Without a capture: nothing is kept and nothing saved.
+    ZORLogGenerator(const GeneratorEnvironment& environment, WithoutParts without)
+        : LogGenerator(environment, without) {}
+
     /// Appends a packet to the raw capture.
     void capture(Bytes packet);
     /// Hands the capture over to the state's "DisplayState" and starts an empty one.
     void handOverCapture(Dictionary& state);
 
 private:
-    std::shared_ptr<ByteBuffer> _binData;
+    std::shared_ptr<ByteBuffer> _binData; // null without parts
 };
 
 /// A buffer of `size` bytes that begins with the version report of `environment`'s build, now.

@@ -39,12 +39,18 @@ ZORLogGenerator2::~ZORLogGenerator2() {
 }
 
 void ZORLogGenerator2::updateState(Dictionary& state, Bytes data) {
+    if (cIndex == nullptr) {
+        return;
+    }
     (void)getDisplayFromState(state); // every record has its section before the first dispatch
     updateWithData(data);
     capture(data);
 }
 
 void ZORLogGenerator2::updateWithData(Bytes data) {
+    if (cIndex == nullptr) {
+        return;
+    }
     const LogRecord record(LogPacketStripPrefix(data));
     if (!record.has(LogRecord::kHeaderLength)) {
         systemLog(LogPriority::Warning, "Invalid data packet len=%lu expected=%lu", record.length(),
@@ -80,6 +86,9 @@ PropertyList ZORLogGenerator2::loadTemplate(Dictionary& state) const {
 }
 
 PropertyList ZORLogGenerator2::getDisplayFromState(Dictionary& state) {
+    if (cIndex == nullptr) {
+        return {};
+    }
     if (const PropertyList* display = state.find("Display")) {
         return *display;
     }
@@ -98,6 +107,9 @@ PropertyList ZORLogGenerator2::getDisplayFromState(Dictionary& state) {
 }
 
 PropertyList ZORLogGenerator2::processTemplate(const PropertyList& object) {
+    if (cIndex == nullptr) {
+        return {};
+    }
     if (object.isString()) {
         return object;
     }
@@ -147,6 +159,9 @@ void ZORLogGenerator2::printDict(const PropertyList& object) {
 }
 
 PropertyList ZORLogGenerator2::generateLogUsingState(Dictionary& state) {
+    if (cIndex == nullptr) {
+        return {};
+    }
     PropertyList display = getDisplayFromState(state);
     handOverCapture(state);
     updateHistoryInState(state, environment().clock);
@@ -154,6 +169,9 @@ PropertyList ZORLogGenerator2::generateLogUsingState(Dictionary& state) {
 }
 
 PropertyList ZORLogGenerator2::getStartCommand() const {
+    if (cIndex == nullptr) {
+        return {};
+    }
     constexpr auto kFirstExtraCode = static_cast<std::int32_t>(kExtendedLogCodes);
     Array logCodes;
     Array extraCodes;

@@ -14,6 +14,9 @@ namespace pallax {
 ///
 /// A template is a property list of dictionaries, arrays and strings; a dictionary key that
 /// equals a record's section name makes its value that record's section, at any depth.
+///
+/// A technology that has no template to offer makes a generator without parts, on which every call
+/// does nothing and returns nothing.
 class ZORLogGenerator2 : public ZORLogGenerator {
 public:
     ~ZORLogGenerator2() override;
@@ -39,12 +42,14 @@ protected:
         std::shared_ptr<ClassIndex> cIndex;
     };
     ZORLogGenerator2(const GeneratorEnvironment& environment, Parts parts);
+    ZORLogGenerator2(const GeneratorEnvironment& environment, WithoutParts without)
+        : ZORLogGenerator(environment, without) {}
 
 private:
     PropertyList loadTemplate(Dictionary& state) const;
 
     std::string pListName;
-    std::shared_ptr<ClassIndex> cIndex;
+    std::shared_ptr<ClassIndex> cIndex; // null without parts
 };
 
 } // namespace pallax

@@ -36,4 +36,8 @@ std::vector<SamplePacket> umtsDrivePackets();
 /// technology.
 std::vector<SamplePacket> lteDrivePackets();
 
+/// Two minutes of a UTRAN phone in a car: a data session on its own channel that ends over the
+/// shared and the paging states, two cell changes, neighbours that come and go.
+std::vector<SamplePacket> utranDrivePackets();
+
 } // namespace pallax

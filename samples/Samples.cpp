@@ -12,6 +12,7 @@ std::span<const Sample> samples() {
         {"gsm-attach.pcap", "gsm", gsmAttachPackets},
         {"umts-drive.pcap", "gsm", umtsDrivePackets},
         {"lte-drive.pcap", "lte", lteDrivePackets},
+        {"utran-drive.pcap", "utran", utranDrivePackets},
     });
     return kSamples;
 }

@@ -1,0 +1,58 @@
+#include "LogGenerator/UTRAN/RRC_State.h"
+
+#include "platform/SystemLog.h"
+
+#include <array>
+
+namespace pallax {
+
+namespace {
+
+constexpr LogCode kStateLogCode = 0xD0E0;
+constexpr auto kLogCodes = std::to_array<LogCode>({kStateLogCode});
+constexpr std::size_t kExpectedLength = 15;
+
+constexpr std::size_t kVersionOffset = 13;
+constexpr std::uint8_t kKnownVersion = 1;
+constexpr std::size_t kModeOffset = 14;
+constexpr std::uint8_t kModeOfForeignVersion = 255;
+
+constexpr auto kModes = std::to_array<std::string_view>({
+    "Disconnected",
+    "Connecting",
+    "Cell Fach",
+    "Cell DCH",
+    "Cell PCH",
+    "Cell URA PCH",
+});
+static_assert(kModes.size() == 6);
+constexpr Conversion kModeLabel = Conversion::label(kModes, "Unknown RRC Mode");
+
+std::uint8_t modeOf(const LogRecord& record) {
+    return record.u8(kVersionOffset) == kKnownVersion ? record.u8(kModeOffset)
+                                                      : kModeOfForeignVersion;
+}
+
+} // namespace
+
+std::span<const LogCode> RRC_State::getLogCodeArray() const {
+    return kLogCodes;
+}
+
+void RRC_State::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Warning, "RRC Info");
+    if (logCode != kStateLogCode) {
+        return;
+    }
+    if (!record.has(kExpectedLength)) {
+        systemLog(LogPriority::Warning, "LogCode_0xD0E0 is length is %ld expected size %ld",
+                  record.length(), kExpectedLength);
+    }
+    const std::uint8_t mode = modeOf(record);
+    const PropertyList label = kModeLabel.valueOf(mode);
+    show("State", label);
+    systemLog(LogPriority::Warning, "Display Dict = %@, rrc mode = %d %@", sectionRef(), mode,
+              label);
+}
+
+} // namespace pallax

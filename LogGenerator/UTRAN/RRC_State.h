@@ -1,0 +1,23 @@
+#pragma once
+
+#include "LogGenerator/Records/Base.h"
+
+namespace pallax {
+
+/// The state of the radio resource control, section "RRC Info".
+///
+///   0xD0E0
+///   byte  width  key    shown as
+///   13    8             record version
+///   14    8      State  label (kModes), "Unknown RRC Mode" beyond
+///
+/// Only version 1 is understood; under any other the mode counts as 255. A record shorter than 15
+/// bytes is reported and read all the same. Other codes are ignored silently.
+class RRC_State final : public Base {
+public:
+    std::string_view getSectionName() const override { return "RRC Info"; }
+    std::span<const LogCode> getLogCodeArray() const override;
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
+};
+
+} // namespace pallax

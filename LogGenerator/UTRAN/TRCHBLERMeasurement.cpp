@@ -1,0 +1,31 @@
+#include "LogGenerator/UTRAN/TRCHBLERMeasurement.h"
+
+#include "LogGenerator/UTRAN/ChannelQuality.h"
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr auto kFields = std::to_array<Field>({
+    {"TRCH ID", u8At(0), Conversion::number()},
+    {"TRCH BLER Measurement", u8At(1), Conversion::number()},
+});
+
+} // namespace
+
+std::span<const LogCode> TRCHBLERMeasurement::getLogCodeArray() const {
+    return kChannelQualityLogCodes;
+}
+
+void TRCHBLERMeasurement::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(LogPriority::Notice, "TRCH BLER Measurement"); // the one record that notes it
+    if (logCode != kChannelQualityLogCode || !record.has(kChannelQualityMinimumLength)) {
+        return;
+    }
+    clearList();
+    replaceList(transportChannels(record).map(
+        [](const LogRecord& entry, std::size_t /*index*/) { return entryOf(kFields, entry); }));
+}
+
+} // namespace pallax

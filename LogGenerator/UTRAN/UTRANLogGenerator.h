@@ -1,0 +1,24 @@
+#pragma once
+
+#include "LogGenerator/ZORLogGenerator2.h"
+
+#include <string>
+
+namespace pallax {
+
+/// The generator of the UTRAN technology: UTRANClassIndex over the first template among the
+/// resources, in their sorted order, whose path contains "UTRAN" in any letter case.
+///
+/// Without such a template it is a generator without parts (see ZORLogGenerator2), and nothing is
+/// logged of its making.
+class UTRANLogGenerator final : public ZORLogGenerator2 {
+public:
+    static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment);
+
+    /// Over the template of that name.
+    UTRANLogGenerator(const GeneratorEnvironment& environment, std::string templateName);
+    /// Without a template.
+    explicit UTRANLogGenerator(const GeneratorEnvironment& environment);
+};
+
+} // namespace pallax
