@@ -38,16 +38,10 @@ constexpr auto kCellNumbers = std::to_array<CellNumber>({
 
 /// The cell monitor counts levels in steps of this many dBm.
 constexpr int kRssiStepDbm = 2;
-
-PropertyList monitoredCell(const PropertyList& cell) {
-    const auto entry = std::make_shared<Dictionary>();
-    showCellNumbers(entry, kCellNumbers, cell);
-    if (const auto rssi =
-            cellNumber(cell, kHXCellMonitorRSSI, "NeighboringCells: Failed to retrieve RSSI\n")) {
-        entry->setFixed(kRSSIKey, cellLevel(*rssi, kDecimalDbm, kRssiStepDbm));
-    }
-    return entry;
-}
+constexpr auto kCellLevels = std::to_array<CellLevel>({
+    {kRSSIKey, kHXCellMonitorRSSI, "NeighboringCells: Failed to retrieve RSSI\n", &kDecimalDbm,
+     kRssiStepDbm},
+});
 
 } // namespace
 
@@ -105,17 +99,10 @@ void NeighboringCells::rememberBsics(const LogRecord& record) {
 
 void NeighboringCells::showMonitoredCells(const LogRecord& record) {
     clearList(); // what cannot be read leaves the list empty
-    const std::optional<Array> cells = readCellMonitorArray(record);
-    if (!cells) {
-        return logNoCellArray();
+    if (const std::optional<Array> cells = cellMonitorArrayOrLog(record)) {
+        replaceList(cellEntries(*cells, kHXCellMonitorRadioAccessTechnologyGSM,
+                                kHXCellMonitorCellTypeNeighbor, kCellNumbers, kCellLevels));
     }
-    Array neighbours;
-    for (const PropertyList& cell : *cells) {
-        if (isCell(cell, kHXCellMonitorRadioAccessTechnologyGSM, kHXCellMonitorCellTypeNeighbor)) {
-            neighbours.push_back(monitoredCell(cell));
-        }
-    }
-    replaceList(std::move(neighbours));
 }
 
 } // namespace pallax
