@@ -71,9 +71,12 @@ void NeighboringCells::showMeasuredCells(const LogRecord& record) {
     if (!record.has(kMeasurementLength)) {
         return;
     }
+    clearList();
     const EntryList neighbours(record, kNeighbours, record.u8(kNeighbourCountOffset));
-    replaceList(neighbours.map(
-        [this](const LogRecord& entry, std::size_t) { return measuredCell(entry); }));
+    if (neighbours.count() != 0) {
+        replaceList(neighbours.map(
+            [this](const LogRecord& entry, std::size_t) { return measuredCell(entry); }));
+    }
 }
 
 PropertyList NeighboringCells::measuredCell(const LogRecord& entry) const {
@@ -91,7 +94,8 @@ void NeighboringCells::rememberBsics(const LogRecord& record) {
     }
     arfcnToBsic.clear(); // also when the new list is empty
     const EntryList bsics(record, kBsics, record.u8(kBsicCountOffset));
-    for (std::size_t index = 0; index < bsics.wholeCount(); ++index) {
+    const std::size_t whole = bsics.wholeCount();
+    for (std::size_t index = 0; index < whole; ++index) {
         const LogRecord entry = bsics.at(index);
         arfcnToBsic.insert_or_assign(entry.u16(kArfcnInEntry), entry.u8(kBsicInEntry));
     }
