@@ -27,8 +27,12 @@ unsigned energyOf(int ecno_db) {
     return static_cast<unsigned>(energy);
 }
 
-/// The receive AGC under which the searcher shows that level.
-int agcOf(const UmtsCell& cell) {
+/// The receive AGC under which the searcher shows the level of the first cell; 0 without a cell.
+int agcOf(const std::vector<UmtsCell>& cells) {
+    if (cells.empty()) {
+        return 0;
+    }
+    const UmtsCell& cell = cells.front();
     return (cell.rscp_dbm - cell.ecno_db + 106) * 10 - 512;
 }
 
@@ -55,14 +59,15 @@ ByteBuffer servingPlmnRecord(unsigned lac, unsigned rac) {
 }
 
 ByteBuffer equivalentPlmnRecord() {
-    // Entries stand 3 bytes apart and are read 6 bytes long.
-    return Record(0x7150).padTo(16).u8(2).append({2, 0, 6, 2, 0, 3, 0, 1, 1}).prefixed();
+    // The digits of country and network take turns: 262 and 020. One entry only, for entries stand
+    // 3 bytes apart and are read 6 bytes long, so that a second one shared half of these digits.
+    return Record(0x7150).padTo(16).u8(1).append({2, 0, 6, 2, 2, 0}).prefixed();
 }
 
 ByteBuffer searcherRecord(const std::vector<UmtsCell>& cells) {
     constexpr unsigned kMonitored = 1;
     Record record(0x417A);
-    record.s16(agcOf(cells.front())).u8(static_cast<unsigned>(cells.size()));
+    record.s16(agcOf(cells)).u8(static_cast<unsigned>(cells.size()));
     for (std::size_t index = 0; index < cells.size(); ++index) {
         const unsigned set = index == 0 ? 0 : kMonitored;
         record.append({0, 0, 0, 0, 0, 0, 0});
@@ -129,11 +134,23 @@ ByteBuffer blerRecord(unsigned window, unsigned received, unsigned errors) {
         .prefixed();
 }
 
-ByteBuffer hsdpaRecord(unsigned subFrames, unsigned receivedBits, unsigned errors) {
+ByteBuffer hsdpaRecord(unsigned subFrames, unsigned receivedBits, unsigned errors,
+                       Carriers carriers) {
+    constexpr unsigned kPrimary = 2;
+    constexpr unsigned kDualCarrier = 2; // above the ten bits of the sub-frames
+    constexpr std::size_t kSecondaryStart = 18 + 162 * kPrimary;
+    const bool dual = carriers == Carriers::Two;
     Record record(0x4221);
-    record.u8(1).u16(subFrames).u8(2).u8(0);
-    for (unsigned process = 0; process < 2; ++process) {
-        record.u8(process).u32(receivedBits + process * 640).u16(subFrames / 2).u16(errors);
+    record.u8(1).u16(subFrames | (dual ? kDualCarrier << 10U : 0U)).u8(kPrimary).u8(dual ? 1 : 0);
+    const auto process = [&](unsigned identity, unsigned bits) {
+        record.u8(identity).u32(bits).u16(subFrames / 2).u16(errors);
+    };
+    for (unsigned identity = 0; identity < kPrimary; ++identity) {
+        process(identity, receivedBits + identity * 640);
+    }
+    if (dual) {
+        record.padTo(kSecondaryStart);
+        process(0, receivedBits / 2);
     }
     return record.prefixed();
 }
@@ -146,6 +163,8 @@ ByteBuffer gsmMeasurementRecord(const GsmCell& serving, const std::vector<GsmCel
     const auto level = [](const GsmCell& cell) { return static_cast<unsigned>(-cell.rxLevel_dbm); };
     Record record(0x5137);
     record.u8(0).u8(0).u8(level(serving));
+    // C1 and C2. "GSM RR Info" shows the same words as its Rx quality, which therefore goes far
+    // beyond the 0 to 7 of a real one.
     record.s32(serving.rxLevel_dbm + 105).s32(serving.rxLevel_dbm + 111);
     record.padTo(26).u8(1).u8(0).u8(static_cast<unsigned>(neighbours.size()));
     for (const GsmCell& cell : neighbours) {

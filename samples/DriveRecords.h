@@ -30,10 +30,10 @@ ByteBuffer plainRecord(unsigned logCode, const std::vector<unsigned>& payload, s
 
 /// 0x7135: service, identity and areas of the serving network.
 ByteBuffer servingPlmnRecord(unsigned lac, unsigned rac);
-/// 0x7150: two equivalent networks.
+/// 0x7150: one equivalent network, 262-20.
 ByteBuffer equivalentPlmnRecord();
 
-/// 0x417A: the active cell and its neighbours in the monitored set.
+/// 0x417A: the active cell, which is the first, and its neighbours in the monitored set.
 ByteBuffer searcherRecord(const std::vector<UmtsCell>& cells);
 /// 0x4005: the ranking of the UMTS cells, or of the GSM cells where there are no others.
 ByteBuffer rankingRecord(const std::vector<UmtsCell>& umts, const std::vector<GsmCell>& gsm);
@@ -43,8 +43,10 @@ ByteBuffer umtsIdentityRecord(unsigned uarfcn, unsigned cellId, unsigned ura);
 ByteBuffer transmitPowerRecord(int power_dbm);
 /// 0x4116: blocks received and in error on two transport channels.
 ByteBuffer blerRecord(unsigned window, unsigned received, unsigned errors);
-/// 0x4221: two primary HARQ processes.
-ByteBuffer hsdpaRecord(unsigned subFrames, unsigned receivedBits, unsigned errors);
+/// 0x4221: two primary HARQ processes, and on two carriers a secondary one.
+enum class Carriers { One, Two };
+ByteBuffer hsdpaRecord(unsigned subFrames, unsigned receivedBits, unsigned errors,
+                       Carriers carriers);
 
 /// 0x5134: identity of the serving GSM cell.
 ByteBuffer gsmIdentityRecord(const GsmCell& cell, unsigned cellId);

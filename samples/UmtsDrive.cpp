@@ -22,25 +22,50 @@ bool inSession(int second) {
     return (second >= 14 && second < 40) || (second >= 100 && second < 114);
 }
 
-/// The UMTS cells around, the serving one first. It changes at second 30 and behind the hill; a
-/// third neighbour comes into sight for a while.
+/// What the hill takes from every UMTS cell, in dB: ever more before the phone gives up on them,
+/// ever less after it has found them again.
+int hillLoss_db(int second) {
+    constexpr int kSlope_dbPerSecond = 4;
+    constexpr int kSlopeSeconds = 5;
+    const int before = second - (kToGsm - 1 - kSlopeSeconds);
+    const int after = kToUmts + kSlopeSeconds - second;
+    return kSlope_dbPerSecond * std::max(0, second < kToUmts ? before : after);
+}
+
+/// What the searcher shows at least of a level, and of its part of the carrier.
+constexpr int kLeast_dbm = -118;
+constexpr int kLeast_db = -20;
+
+/// The UMTS cells around, the strongest first, which serves: it changes whenever the car has come
+/// nearer to the other one. A third cell comes into sight for a while.
 std::vector<UmtsCell> umtsCells(int second) {
-    const int near = wave(second, 40, -104, -78);
-    const int far = wave(second + 20, 40, -106, -82);
-    std::vector<UmtsCell> cells = {{212, kUarfcn, near, wave(second, 20, -11, -4)},
-                                   {388, kUarfcn, far, wave(second + 10, 20, -13, -6)}};
-    if (second >= 30) {
-        std::swap(cells[0], cells[1]);
-    }
+    const int loss_db = hillLoss_db(second);
+    const auto level_dbm = [loss_db](int level) { return std::max(level - loss_db, kLeast_dbm); };
+    std::vector<UmtsCell> cells = {{212, kUarfcn, level_dbm(wave(second, 40, -104, -78)), 0},
+                                   {388, kUarfcn, level_dbm(wave(second + 20, 40, -106, -82)), 0}};
     if (second % 30 >= 12) {
-        cells.push_back({97, kUarfcn, -109 + second % 7, -15});
+        cells.push_back({97, kUarfcn, level_dbm(-109 + second % 7), 0});
+    }
+    std::stable_sort(cells.begin(), cells.end(),
+                     [](const UmtsCell& a, const UmtsCell& b) { return a.rscp_dbm > b.rscp_dbm; });
+    // All cells share one carrier: what is weaker than the strongest has that much less of it.
+    const int best_db = wave(second, 20, -9, -5) - loss_db / 4;
+    for (UmtsCell& cell : cells) {
+        cell.ecno_db = std::max(best_db + cell.rscp_dbm - cells.front().rscp_dbm, kLeast_db);
     }
     return cells;
 }
 
+/// The further away the cell is, the louder the phone: by open-loop power control.
+int transmitPower_dbm(const UmtsCell& serving) {
+    constexpr int kSumOfBoth = -93;
+    constexpr int kLargest_dbm = 21;
+    return std::min(kSumOfBoth - serving.rscp_dbm, kLargest_dbm);
+}
+
 std::vector<GsmCell> gsmNeighbours(int second) {
-    std::vector<GsmCell> cells = {{86, 17, wave(second, 24, -96, -80)},
-                                  {17, 42, wave(second + 9, 24, -99, -84)}};
+    std::vector<GsmCell> cells = {{86, 17, wave(second, 24, -96, -84)},
+                                  {17, 42, wave(second + 9, 24, -99, -86)}};
     if (second % 16 >= 6) {
         cells.push_back({771, 5, -101 + second % 5});
     }
@@ -48,7 +73,11 @@ std::vector<GsmCell> gsmNeighbours(int second) {
 }
 
 GsmCell gsmServing(int second) {
-    return {42, 33, wave(second, 30, -92, -71)};
+    return {42, 33, wave(second, 30, -82, -71)};
+}
+
+unsigned cellIdOf(const UmtsCell& cell) {
+    return 0x00A40000 + cell.scramblingCode;
 }
 
 void addSimAndContexts(Drive& drive) {
@@ -61,8 +90,12 @@ void addSimAndContexts(Drive& drive) {
         {"kSimFile_MSISDN", "+4915112345678"},
         {"kSimFile_MBDN", "3311"},
         {"kSimFile_HPPLMN", PropertyList::integer(6)},
-        {"kSimFile_LOCI", PropertyList::data({0x01, 0x02, 0x03, 0x62, 0xF2, 0x24, 0x1A, 0x2B})},
-        {"kSimFile_PSLOCI", PropertyList::data({0x04, 0x05, 0x06, 0x62, 0xF2, 0x24, 0x1A, 0x2B})},
+        // Temporary identity, location area, a reserved byte, status "updated".
+        {"kSimFile_LOCI",
+         PropertyList::data({0xA1, 0xB2, 0xC3, 0xD4, 0x62, 0xF2, 0x24, 0x1A, 0x2B, 0xFF, 0x00})},
+        // Temporary identity, its signature, routing area, status "updated".
+        {"kSimFile_PSLOCI", PropertyList::data({0xE5, 0xF6, 0x07, 0x18, 0x29, 0x3A, 0x4B, 0x62,
+                                                0xF2, 0x24, 0x1A, 0x2B, 0x07, 0x00})},
         {"kSimFile_ACC", "0x0100"},
         {"kSimFile_AD", PropertyList::data({0x00, 0x00, 0x00, 0x02})},
         {"kSimFile_FPLMN", std::move(networks)},
@@ -80,46 +113,71 @@ void addSimAndContexts(Drive& drive) {
     drive.add(14200, propertyListRecordOf(0xFF0002, Array{internet, messages}, ListForm::Binary));
 }
 
-void addRegistration(Drive& drive) {
+/// The radio connection of UMTS comes with its ciphering, and goes with it.
+void addConnection(Drive& drive, int milliseconds, bool connected) {
+    drive.add(milliseconds, plainRecord(0x4125, {connected ? 3U : 0U}, 14));
+    drive.add(milliseconds + 10, plainRecord(0x4157, {connected ? 1U : 0U}, 19));
+}
+
+void addPowerOn(Drive& drive) {
     drive.add(200, plainRecord(0x7132, {2, 0}, 16));
-    drive.add(260, plainRecord(0x7131, {19, 8, 0}, 16));
-    drive.add(300, plainRecord(0x7130, {3, 0, 0}, 16));
-    drive.add(340, servingPlmnRecord(kLocationArea, 7));
-    drive.add(380, equivalentPlmnRecord());
-    drive.add(900, plainRecord(0x7132, {1, 0}, 16));
-    for (const int change : {kToGsm, kToUmts}) { // a routing-area update at each change
+    addConnection(drive, 220, true);
+    drive.add(260, plainRecord(0x7131, {3, 5, 1}, 16));
+    drive.add(300, plainRecord(0x7130, {2, 2, 1}, 16));
+    drive.add(3400, plainRecord(0x7132, {1, 0}, 16));
+    drive.add(3440, plainRecord(0x7131, {19, 8, 0}, 16));
+    drive.add(3480, plainRecord(0x7130, {3, 0, 0}, 16));
+    drive.add(3520, servingPlmnRecord(kLocationArea, 7));
+    drive.add(3560, equivalentPlmnRecord());
+    addConnection(drive, 3600, false);
+}
+
+/// A routing-area update at each change of the technology; a few seconds long.
+void addAreaUpdates(Drive& drive) {
+    for (const int change : {kToGsm, kToUmts}) {
         const int start = change * 1000;
         drive.add(start + 300, plainRecord(0x7130, {5, 8, 0}, 16));
         drive.add(start + 350, plainRecord(0x7131, {13, 5, 0}, 16));
-        drive.add(start + 1100, plainRecord(0x7131, {19, 8, 0}, 16));
-        drive.add(start + 1400, plainRecord(0x7130, {3, 0, 0}, 16));
-        drive.add(start + 1450, servingPlmnRecord(kLocationArea, change == kToGsm ? 9 : 7));
+        drive.add(start + 1800, plainRecord(0x7131, {3, 5, 0}, 16));
+        drive.add(start + 3600, plainRecord(0x7131, {19, 8, 0}, 16));
+        drive.add(start + 3700, plainRecord(0x7130, {3, 0, 0}, 16));
+        drive.add(start + 3750, servingPlmnRecord(kLocationArea, change == kToGsm ? 9 : 7));
+    }
+    addConnection(drive, kToUmts * 1000 + 250, true);
+    addConnection(drive, kToUmts * 1000 + 3800, false);
+}
+
+void addSessionSecond(Drive& drive, int second) {
+    const int start = second * 1000;
+    const UmtsCell serving = umtsCells(second).front();
+    const auto errors = static_cast<unsigned>(-serving.ecno_db);
+    const Carriers carriers = second % 8 == 3 ? Carriers::Two : Carriers::One;
+    drive.add(start + 300, transmitPowerRecord(transmitPower_dbm(serving)));
+    drive.add(start + 500,
+              hsdpaRecord(100, 320000 + 4000 * static_cast<unsigned>(second), errors, carriers));
+    if (second % 2 == 0) {
+        drive.add(start + 700, blerRecord(200, 180, errors));
     }
 }
 
-void addUmtsSecond(Drive& drive, int second) {
+/// `servingBefore` is the scrambling code of the second before, 0 for none.
+void addUmtsSecond(Drive& drive, int second, unsigned servingBefore) {
     const int start = second * 1000;
     const std::vector<UmtsCell> cells = umtsCells(second);
-    if (second % 30 == 0 || second == kToUmts) {
-        const unsigned cellId = 0x00A40000 + cells[0].scramblingCode;
-        drive.add(start + 20, umtsIdentityRecord(kUarfcn, cellId, 3));
+    if (cells[0].scramblingCode != servingBefore) {
+        drive.add(start + 20, umtsIdentityRecord(kUarfcn, cellIdOf(cells[0]), 3));
     }
-    if (inSession(second) != inSession(second - 1) || second == kToUmts || second == 1) {
-        drive.add(start + 30, plainRecord(0x4125, {inSession(second) ? 3U : 0U}, 14));
-        drive.add(start + 40, plainRecord(0x4157, {inSession(second) ? 1U : 0U}, 19));
+    if (second > 0 && inSession(second) != inSession(second - 1)) {
+        addConnection(drive, start + 30, inSession(second));
     }
     drive.add(start + 100, searcherRecord(cells));
     drive.add(start + 600, searcherRecord(cells));
-    if (!inSession(second)) {
-        drive.add(start + 250, second % 6 == 5 ? rankingRecord({}, gsmNeighbours(second))
-                                               : rankingRecord(cells, {}));
-        return;
-    }
-    const auto errors = static_cast<unsigned>(-cells[0].ecno_db);
-    drive.add(start + 300, transmitPowerRecord(wave(second, 26, -18, 15)));
-    drive.add(start + 500, hsdpaRecord(100, 320000 + 4000 * static_cast<unsigned>(second), errors));
-    if (second % 2 == 0) {
-        drive.add(start + 700, blerRecord(200, 180, errors));
+    if (inSession(second)) {
+        addSessionSecond(drive, second);
+    } else if (second % 5 == 4) {
+        drive.add(start + 250, rankingRecord({}, gsmNeighbours(second)));
+    } else if (second % 5 != 0) { // in between both sets are left standing
+        drive.add(start + 250, rankingRecord(cells, {}));
     }
 }
 
@@ -142,7 +200,8 @@ void addGsmSecond(Drive& drive, int second) {
     const int start = second * 1000;
     const bool dedicated = second >= 68 && second < 84;
     if (second == kToGsm) {
-        drive.add(start + 10, plainRecord(0x512C, {18, 0, 0, 1}, 17));
+        drive.add(start + 10, plainRecord(0x512C, {14, 0, 0, 1}, 17)); // from UMTS
+        drive.add(start + 20, searcherRecord({}));                     // no cell is left there
         addGsmBroadcast(drive, start + 500);
     }
     if (second == kToGsm + 2 || second == 84) {
@@ -151,6 +210,9 @@ void addGsmSecond(Drive& drive, int second) {
     if (second == 68) {
         drive.add(start + 10, plainRecord(0x512C, {9, 2, 1, 1}, 17));
         drive.add(start + 30, plainRecord(0x5076, {58, 0}, 17));
+    }
+    if (second == kToUmts - 1) {
+        drive.add(start + 10, plainRecord(0x512C, {18, 0, 0, 1}, 17)); // to UMTS
     }
     if (second % 8 == 0) {
         drive.add(start + 150, plainRecord(0x5072, {0, 0, 0, 0, 0, 0, dedicated ? 1U : 0U}, 20));
@@ -167,8 +229,7 @@ void addCellMonitor(Drive& drive, int second) {
         cells.push_back(gsmCellEntry(gsmServing(second), true, 0x2F31, kLocationArea));
     } else {
         const UmtsCell serving = umtsCells(second)[0];
-        cells.push_back(
-            umtsCellEntry(serving, true, 0x00A40000 + serving.scramblingCode, kLocationArea));
+        cells.push_back(umtsCellEntry(serving, true, cellIdOf(serving), kLocationArea));
     }
     for (const GsmCell& cell : gsmNeighbours(second)) {
         cells.push_back(gsmCellEntry(cell, false, 0, 0));
@@ -179,7 +240,7 @@ void addCellMonitor(Drive& drive, int second) {
             cells.push_back(umtsCellEntry(*cell, false, 0, 0));
         }
     }
-    const ListForm form = second % 10 == 0 ? ListForm::Xml : ListForm::Binary;
+    const ListForm form = second % 10 == 4 ? ListForm::Xml : ListForm::Binary;
     drive.add(second * 1000 + 850, propertyListRecordOf(0xFF0001, cells, form));
 }
 
@@ -188,14 +249,19 @@ void addCellMonitor(Drive& drive, int second) {
 std::vector<SamplePacket> umtsDrivePackets() {
     Drive drive;
     addSimAndContexts(drive);
-    addRegistration(drive);
+    addPowerOn(drive);
+    addAreaUpdates(drive);
+    unsigned serving = 0;
     for (int second = 0; second < kSeconds; ++second) {
         if (onGsm(second)) {
             addGsmSecond(drive, second);
+            serving = 0;
         } else {
-            addUmtsSecond(drive, second);
+            addUmtsSecond(drive, second, serving);
+            serving = umtsCells(second).front().scramblingCode;
         }
-        if (second % 5 == 0) {
+        if (second % 5 == 4) {
+            // Behind a GSM ranking, which empties the UMTS set, so that both stand side by side.
             addCellMonitor(drive, second);
         }
     }

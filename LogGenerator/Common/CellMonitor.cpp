@@ -32,6 +32,14 @@ void logNoCellArray() {
     systemLog(LogPriority::Error, "Failed to get Cell Array\n");
 }
 
+std::optional<Array> cellMonitorArrayOrLog(const LogRecord& record) {
+    std::optional<Array> cells = readCellMonitorArray(record);
+    if (!cells) {
+        logNoCellArray();
+    }
+    return cells;
+}
+
 bool isCell(const PropertyList& element, std::string_view radioAccessTechnology,
             std::string_view cellType) {
     const DictionaryRef cell = element.dictionary();
@@ -76,6 +84,31 @@ PropertyList cellLevel(std::int32_t number, const NumberFormat& format, int fact
         return Text::fixed("");
     }
     return DisplayNumber(std::int64_t{level} * factor, format);
+}
+
+void showCellLevels(const DictionaryRef& target, std::span<const CellLevel> levels,
+                    const PropertyList& cell) {
+    for (const CellLevel& level : levels) {
+        const auto value = cellNumber(cell, level.cellKey, level.failure);
+        if (value && target != nullptr) {
+            target->setFixed(level.key, cellLevel(*value, *level.format, level.factor));
+        }
+    }
+}
+
+Array cellEntries(const Array& cells, std::string_view radioAccessTechnology,
+                  std::string_view cellType, std::span<const CellNumber> numbers,
+                  std::span<const CellLevel> levels) {
+    Array entries;
+    for (const PropertyList& cell : cells) {
+        if (isCell(cell, radioAccessTechnology, cellType)) {
+            const auto entry = std::make_shared<Dictionary>();
+            showCellNumbers(entry, numbers, cell);
+            showCellLevels(entry, levels, cell);
+            entries.emplace_back(entry);
+        }
+    }
+    return entries;
 }
 
 } // namespace pallax

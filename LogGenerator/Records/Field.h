@@ -25,8 +25,9 @@ public:
     }
     static Conversion number(const NumberFormat&& format, double = 1.0, double = 0.0) = delete;
 
-    /// labels[raw + shift, cut to 8 bits], or `beyond` where the table has no such entry. The
-    /// table must live as long as the program.
+    /// labels[raw + shift], or `beyond` where the table has no such entry; with a shift other than
+    /// 0 the index is cut to 8 bits, so that the byte 255 finds the first entry at a shift of 1.
+    /// The table must live as long as the program.
     static constexpr Conversion label(std::span<const std::string_view> labels,
                                       std::string_view beyond = "Unknown", std::uint8_t shift = 0) {
         Conversion result;
@@ -45,7 +46,7 @@ public:
         return result;
     }
 
-    /// The same, but the raw value `exceptional` shows `text` ("Not Present").
+    /// This conversion for every raw value but `exceptional`, which shows `text` ("Not Present").
     constexpr Conversion except(std::int64_t exceptional, std::string_view text) const {
         Conversion result = *this;
         result._exceptional = exceptional;

@@ -47,7 +47,8 @@ Array ActiveSet::cellsOf(const LogRecord& record) const {
                           count);
     const std::int64_t receiveAgc = record.read(kReceiveAgc);
     Array active;
-    for (std::size_t index = 0; index < cells.wholeCount(); ++index) {
+    const std::size_t whole = cells.wholeCount();
+    for (std::size_t index = 0; index < whole; ++index) {
         if (cells.at(index).read(kSetType) != kActive) {
             continue;
         }

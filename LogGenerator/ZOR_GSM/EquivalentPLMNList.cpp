@@ -41,8 +41,12 @@ void EquivalentPLMNList::updateWithData(const LogRecord& record, LogCode logCode
     if (!record.has(kMinimumLength)) {
         return;
     }
+    clearList();
     const EntryList entries(record, kEntries, record.u8(kCountOffset));
-    replaceList(entries.map([](const LogRecord& entry, std::size_t) { return networkOf(entry); }));
+    if (entries.count() != 0) {
+        replaceList(
+            entries.map([](const LogRecord& entry, std::size_t) { return networkOf(entry); }));
+    }
 }
 
 } // namespace pallax

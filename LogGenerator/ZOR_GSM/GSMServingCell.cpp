@@ -60,9 +60,9 @@ void GSMServingCell::updateWithData(const LogRecord& record, LogCode logCode) {
 }
 
 void GSMServingCell::showServingCell(const LogRecord& record) {
-    const std::optional<Array> cells = readCellMonitorArray(record);
+    const std::optional<Array> cells = cellMonitorArrayOrLog(record);
     if (!cells) {
-        return logNoCellArray();
+        return;
     }
     if (const PropertyList* cell = findCell(*cells, kHXCellMonitorRadioAccessTechnologyGSM,
                                             kHXCellMonitorCellTypeServing)) {

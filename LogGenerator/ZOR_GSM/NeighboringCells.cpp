@@ -38,16 +38,10 @@ constexpr auto kCellNumbers = std::to_array<CellNumber>({
 
 /// The cell monitor counts levels in steps of this many dBm.
 constexpr int kRssiStepDbm = 2;
-
-PropertyList monitoredCell(const PropertyList& cell) {
-    const auto entry = std::make_shared<Dictionary>();
-    showCellNumbers(entry, kCellNumbers, cell);
-    if (const auto rssi =
-            cellNumber(cell, kHXCellMonitorRSSI, "NeighboringCells: Failed to retrieve RSSI\n")) {
-        entry->setFixed(kRSSIKey, cellLevel(*rssi, kDecimalDbm, kRssiStepDbm));
-    }
-    return entry;
-}
+constexpr auto kCellLevels = std::to_array<CellLevel>({
+    {kRSSIKey, kHXCellMonitorRSSI, "NeighboringCells: Failed to retrieve RSSI\n", &kDecimalDbm,
+     kRssiStepDbm},
+});
 
 } // namespace
 
@@ -77,9 +71,12 @@ void NeighboringCells::showMeasuredCells(const LogRecord& record) {
     if (!record.has(kMeasurementLength)) {
         return;
     }
+    clearList();
     const EntryList neighbours(record, kNeighbours, record.u8(kNeighbourCountOffset));
-    replaceList(neighbours.map(
-        [this](const LogRecord& entry, std::size_t) { return measuredCell(entry); }));
+    if (neighbours.count() != 0) {
+        replaceList(neighbours.map(
+            [this](const LogRecord& entry, std::size_t) { return measuredCell(entry); }));
+    }
 }
 
 PropertyList NeighboringCells::measuredCell(const LogRecord& entry) const {
@@ -97,7 +94,8 @@ void NeighboringCells::rememberBsics(const LogRecord& record) {
     }
     arfcnToBsic.clear(); // also when the new list is empty
     const EntryList bsics(record, kBsics, record.u8(kBsicCountOffset));
-    for (std::size_t index = 0; index < bsics.wholeCount(); ++index) {
+    const std::size_t whole = bsics.wholeCount();
+    for (std::size_t index = 0; index < whole; ++index) {
         const LogRecord entry = bsics.at(index);
         arfcnToBsic.insert_or_assign(entry.u16(kArfcnInEntry), entry.u8(kBsicInEntry));
     }
@@ -105,17 +103,10 @@ void NeighboringCells::rememberBsics(const LogRecord& record) {
 
 void NeighboringCells::showMonitoredCells(const LogRecord& record) {
     clearList(); // what cannot be read leaves the list empty
-    const std::optional<Array> cells = readCellMonitorArray(record);
-    if (!cells) {
-        return logNoCellArray();
+    if (const std::optional<Array> cells = cellMonitorArrayOrLog(record)) {
+        replaceList(cellEntries(*cells, kHXCellMonitorRadioAccessTechnologyGSM,
+                                kHXCellMonitorCellTypeNeighbor, kCellNumbers, kCellLevels));
     }
-    Array neighbours;
-    for (const PropertyList& cell : *cells) {
-        if (isCell(cell, kHXCellMonitorRadioAccessTechnologyGSM, kHXCellMonitorCellTypeNeighbor)) {
-            neighbours.push_back(monitoredCell(cell));
-        }
-    }
-    replaceList(std::move(neighbours));
 }
 
 } // namespace pallax

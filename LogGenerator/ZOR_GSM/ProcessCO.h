@@ -4,7 +4,8 @@
 
 namespace pallax {
 
-/// The mobility-management state as the connection-oriented side sees it, section "Process CO".
+/// The registration state and the mobility-management state, section "Process CO": what ProcessCS
+/// shows of the same records, without sub-state and reject cause.
 ///
 ///   0x7132, at least 16 bytes
 ///   byte  width  key                 shown as

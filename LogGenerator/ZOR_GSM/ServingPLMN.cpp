@@ -107,9 +107,9 @@ void ServingPLMN::showNetwork(const LogRecord& record) {
 }
 
 void ServingPLMN::showServingCell(const LogRecord& record) {
-    const std::optional<Array> cells = readCellMonitorArray(record);
+    const std::optional<Array> cells = cellMonitorArrayOrLog(record);
     if (!cells) {
-        return logNoCellArray();
+        return;
     }
     const auto cell = std::find_if(cells->begin(), cells->end(), isServing);
     if (cell != cells->end()) {

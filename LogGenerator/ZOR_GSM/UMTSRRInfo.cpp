@@ -72,7 +72,8 @@ int transmitPower_dbm(std::int16_t raw) {
 double meanTransmitPower_dbm(const EntryList& entries) {
     int sum_dbm = 0;
     int counted = 0;
-    for (std::size_t index = 0; index < entries.wholeCount(); ++index) {
+    const std::size_t whole = entries.wholeCount();
+    for (std::size_t index = 0; index < whole; ++index) {
         const std::int16_t raw = entries.at(index).s16(kRawPowerOffset);
         if (raw != 0) {
             sum_dbm += transmitPower_dbm(raw);
@@ -83,16 +84,10 @@ double meanTransmitPower_dbm(const EntryList& entries) {
                         : std::numeric_limits<double>::quiet_NaN();
 }
 
-/// A number that the cell monitor reports, and what is logged without it.
-struct CellKey {
-    std::string_view constant;
-    std::string_view key;
-    std::string_view failure;
-};
-constexpr auto kCellKeys = std::to_array<CellKey>({
-    {kHXCellMonitorCellId, kCellIdKey, "UMTSRRInfo: Failed to retrieve Cell ID\n"},
-    {kHXCellMonitorUARFCN, kUarfcnKey, "UMTSRRInfo: Failed to retrieve UARFCN\n"},
-    {kHXCellMonitorSCN, "Scrambling Code", "UMTSRRInfo: Failed to retrieve Scrambling Code\n"},
+constexpr auto kCellNumbers = std::to_array<CellNumber>({
+    {kCellIdKey, kHXCellMonitorCellId, "UMTSRRInfo: Failed to retrieve Cell ID\n"},
+    {kUarfcnKey, kHXCellMonitorUARFCN, "UMTSRRInfo: Failed to retrieve UARFCN\n"},
+    {"Scrambling Code", kHXCellMonitorSCN, "UMTSRRInfo: Failed to retrieve Scrambling Code\n"},
 });
 
 } // namespace
@@ -147,19 +142,13 @@ void UMTSRRInfo::updateTransmitPower(const LogRecord& record) {
 }
 
 void UMTSRRInfo::updateFromCellMonitor(const LogRecord& record) {
-    const auto cells = readCellMonitorArray(record);
+    const std::optional<Array> cells = cellMonitorArrayOrLog(record);
     if (!cells) {
-        return logNoCellArray();
-    }
-    const PropertyList* cell =
-        findCell(*cells, kHXCellMonitorRadioAccessTechnologyUMTS, kHXCellMonitorCellTypeServing);
-    if (cell == nullptr) {
         return;
     }
-    for (const CellKey& cellKey : kCellKeys) {
-        if (const auto number = cellNumber(*cell, cellKey.constant, cellKey.failure)) {
-            show(cellKey.key, DisplayNumber(std::int64_t{*number}, kDecimal));
-        }
+    if (const PropertyList* cell = findCell(*cells, kHXCellMonitorRadioAccessTechnologyUMTS,
+                                            kHXCellMonitorCellTypeServing)) {
+        showCellNumbers(sectionRef().dictionary(), kCellNumbers, *cell);
     }
 }
 

@@ -34,27 +34,14 @@ constexpr auto kEntryFields = std::to_array<Field>({
     {"Rank Cell RSCP", s16At(5), Conversion::number(kDecimalDb)},
 });
 
-/// What the cell monitor says of one neighbour; a key whose number is missing is left out.
-Dictionary neighbourOf(const PropertyList& cell) {
-    Dictionary neighbour;
-    if (const auto uarfcn =
-            cellNumber(cell, kHXCellMonitorUARFCN, "UMTSSet: Failed to retrieve UARFCN\n")) {
-        neighbour.setFixed("UARFCN", DisplayNumber(std::int64_t{*uarfcn}, kDecimal));
-    }
-    if (const auto code =
-            cellNumber(cell, kHXCellMonitorSCN, "UMTSSet: Failed to retrieve Scrambling Code\n")) {
-        neighbour.setFixed(kScramblingCodeKey, DisplayNumber(std::int64_t{*code}, kDecimal));
-    }
-    if (const auto rscp =
-            cellNumber(cell, kHXCellMonitorRSCP, "UMTSSet: Failed to retrieve RSCP\n")) {
-        neighbour.setFixed(kRscpKey, cellLevel(*rscp, kDecimalDbm));
-    }
-    if (const auto energy =
-            cellNumber(cell, kHXCellMonitorECN0, "UMTSSet: Failed to retrieve Energy Per Chip\n")) {
-        neighbour.setFixed(kEnergyKey, cellLevel(*energy, kDecimalDb));
-    }
-    return neighbour;
-}
+constexpr auto kCellNumbers = std::to_array<CellNumber>({
+    {"UARFCN", kHXCellMonitorUARFCN, "UMTSSet: Failed to retrieve UARFCN\n"},
+    {kScramblingCodeKey, kHXCellMonitorSCN, "UMTSSet: Failed to retrieve Scrambling Code\n"},
+});
+constexpr auto kCellLevels = std::to_array<CellLevel>({
+    {kRscpKey, kHXCellMonitorRSCP, "UMTSSet: Failed to retrieve RSCP\n", &kDecimalDbm},
+    {kEnergyKey, kHXCellMonitorECN0, "UMTSSet: Failed to retrieve Energy Per Chip\n", &kDecimalDb},
+});
 
 } // namespace
 
@@ -89,18 +76,13 @@ void UMTSSet::updateFromRanking(const LogRecord& record) {
 }
 
 void UMTSSet::updateFromCellMonitor(const LogRecord& record) {
-    const auto cells = readCellMonitorArray(record);
+    const std::optional<Array> cells = readCellMonitorArray(record);
     clearList(); // also when nothing could be read
     if (!cells) {
         return logNoCellArray();
     }
-    Array neighbours;
-    for (const PropertyList& cell : *cells) {
-        if (isCell(cell, kHXCellMonitorRadioAccessTechnologyUMTS, kHXCellMonitorCellTypeNeighbor)) {
-            neighbours.emplace_back(neighbourOf(cell));
-        }
-    }
-    replaceList(std::move(neighbours));
+    replaceList(cellEntries(*cells, kHXCellMonitorRadioAccessTechnologyUMTS,
+                            kHXCellMonitorCellTypeNeighbor, kCellNumbers, kCellLevels));
 }
 
 } // namespace pallax

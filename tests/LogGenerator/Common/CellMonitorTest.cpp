@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Records/Formats.h"
 #include "platform/TelephonyConstants.h"
+#include "tests/doubles/CellBuilder.h"
 #include "tests/doubles/PropertyListRecord.h"
 #include "tests/doubles/RecordFixture.h"
 
@@ -88,6 +89,16 @@ TEST(CellMonitor, TheSecondLineOfAFailureEndsInANewline) {
     RecordingLog log;
     logNoCellArray();
     EXPECT_EQ(log.lines(), (Lines{{3, "Failed to get Cell Array\n"}}));
+}
+
+TEST(CellMonitor, ARecordThatLogsBothLinesDoesSoOnlyWithoutAnArray) {
+    RecordingLog log;
+    EXPECT_EQ(cellMonitorArrayOrLog(LogRecord()), std::nullopt);
+    EXPECT_EQ(log.take(), (Lines{{3, "Cell Info Array data could not be constructed"},
+                                 {3, "Failed to get Cell Array\n"}}));
+    const Record record = propertyListRecord(kCellMonitor, Array{"no cell"});
+    EXPECT_EQ(cellMonitorArrayOrLog(LogRecord(record.bytes())), Array{"no cell"});
+    EXPECT_EQ(log.lines(), Lines());
 }
 
 // Cells
@@ -220,6 +231,50 @@ TEST(CellLevel, Is32767AsTheEmptyString) {
     EXPECT_EQ(level(32767), "");
     EXPECT_EQ(level(32767, 2), "");
     EXPECT_EQ(level(0x17FFF), "") << "by its low 16 bits";
+}
+
+constexpr auto kLevels = std::to_array<CellLevel>({
+    {"Level", "l", "no l\n", &kDecimalDbm, 2},
+    {"Ratio", "r", "no r\n", &kDecimalDb},
+});
+
+TEST(CellLevel, SeveralAreShownInOrderAndAMissingOneStopsNoOther) {
+    RecordingLog log;
+    const auto shown = std::make_shared<Dictionary>();
+    showCellLevels(shown, kLevels,
+                   Dictionary{{"r", PropertyList::integer(-7)}, {"l", PropertyList::integer(-40)}});
+    expectInOrder(shown, Dictionary{{"Level", "-80 dBm"}, {"Ratio", "-7 dB"}});
+    EXPECT_EQ(log.take(), Lines());
+    const auto partly = std::make_shared<Dictionary>();
+    showCellLevels(partly, kLevels, Dictionary{{"r", PropertyList::integer(32767)}});
+    expectInOrder(partly, Dictionary{{"Ratio", ""}});
+    EXPECT_EQ(log.lines(), (Lines{{3, "no l\n"}}));
+}
+
+TEST(CellLevel, WithoutATargetOnlyTheMissingOnesAreLogged) {
+    RecordingLog log;
+    showCellLevels(nullptr, kLevels, Dictionary{{"l", PropertyList::integer(1)}});
+    EXPECT_EQ(log.lines(), (Lines{{3, "no r\n"}}));
+}
+
+// Entries
+
+TEST(CellEntries, EveryCellOfTheKindHasItsNumbersAndBehindThemItsLevels) {
+    RecordingLog log;
+    const Array cells = {cell("GSM", "Neighbor", {{"RSSI", -1}}),
+                         cell("UMTS", "Neighbor", {{"RSSI", -40}, {"ARFCN", 62}}),
+                         cell("UMTS", "Serving", {{"RSSI", -2}, {"ARFCN", 63}}), "no cell",
+                         cell("UMTS", "Neighbor")};
+    constexpr auto kNumber =
+        std::to_array<CellNumber>({{"Channel", kHXCellMonitorARFCN, "no channel\n"}});
+    constexpr auto kLevel =
+        std::to_array<CellLevel>({{"Level", kHXCellMonitorRSSI, "no level\n", &kDecimalDbm}});
+    const Array entries = cellEntries(cells, kHXCellMonitorRadioAccessTechnologyUMTS,
+                                      kHXCellMonitorCellTypeNeighbor, kNumber, kLevel);
+    ASSERT_EQ(entries.size(), 2U);
+    expectInOrder(entries[0], Dictionary{{"Channel", "62"}, {"Level", "-40 dBm"}});
+    expectInOrder(entries[1], Dictionary());
+    EXPECT_EQ(log.lines(), (Lines{{3, "no channel\n"}, {3, "no level\n"}}));
 }
 
 } // namespace

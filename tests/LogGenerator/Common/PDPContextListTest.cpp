@@ -49,7 +49,9 @@ TEST(PDPContextList, ReadsTheXmlAndTheTextFormToo) {
 TEST(PDPContextList, ANewArrayReplacesTheEntries) {
     RecordFixture<PDPContextList> fixture;
     fixture.feed(propertyListRecord(kContexts, twoContexts()));
+    EXPECT_EQ(fixture.lines, (Lines{{4, "PDPContextList"}}));
     fixture.feed(propertyListRecord(kContexts, Array{"other"}));
+    EXPECT_EQ(fixture.lines, (Lines{{4, "PDPContextList"}}));
     EXPECT_EQ(fixture.section(), PropertyList(Array{"other"}));
 }
 
@@ -89,6 +91,18 @@ TEST(PDPContextList, TheCodeIsNotChecked) {
 
 TEST(PDPContextList, AnyBytesNeitherThrowNorLeaveAKey) {
     anyBytesKeepWithin<PDPContextList>({}); // random bytes make no dictionary inside an array
+}
+
+TEST(PDPContextList, AnyArrayIsShownAsItIsAndAnythingElseChangesNothing) {
+    EXPECT_TRUE(rc::check([] {
+        RecordFixture<PDPContextList> fixture;
+        fixture.list() = Array{"what was shown before"};
+        const PropertyList root = anyPropertyList({"APN", "Address"});
+        fixture.feed(propertyListRecord(kContexts, root));
+        const bool list = root.array() != nullptr;
+        RC_CLASSIFY(list);
+        RC_ASSERT(fixture.section() == (list ? root : Array{"what was shown before"}));
+    }));
 }
 
 } // namespace

@@ -62,11 +62,14 @@ TEST(SimInfo, ValuesAreStoredAsTheyComeWhateverTheirType) {
     const auto number = PropertyList::integer(6);
     const auto bytes = PropertyList::data({0x89, 0x10});
     const PropertyList list = Array{"310260", "310410"};
-    const PropertyList nested = Dictionary{{"Full Name", "Example"}};
+    const PropertyList nested =
+        Dictionary{{"Full Name", "Example"}, {"Logo", Dictionary{{"Shown", "once"}}}};
+    const PropertyList updated = Date(std::chrono::seconds(1700000000));
     expectInOrder(sectionAfter<SimInfo>(propertyListRecord(
                       kSimFiles, Dictionary{{"kSimFile_ICCID", "8901"},
                                             {"kSimFile_HPPLMN", number},
                                             {"kSimFile_LOCI", bytes},
+                                            {"kSimFile_AD", updated},
                                             {"kSimFile_FPLMN", list},
                                             {"kSimFile_PNN", nested},
                                             {"kSimFile_OPL", PropertyList::real(0.5)},
@@ -74,6 +77,7 @@ TEST(SimInfo, ValuesAreStoredAsTheyComeWhateverTheirType) {
                   Dictionary{{"EF-ICCID", "8901"},
                              {"EF-HPPLMN SEARCH PERIOD", number},
                              {"EF-LOCI", bytes},
+                             {"EF-ADMINISTRATIVE DATA", updated},
                              {"EF-FPLMN", list},
                              {"EF-RAT MODE", PropertyList::boolean(true)},
                              {"EF-PLMN NETWORK NAME", nested},
@@ -167,6 +171,27 @@ TEST(SimInfo, AnyBytesKeepWithinItsKeysAndRaiseItsExceptionOnly) {
         keys.insert(row.second);
     }
     anyBytesKeepWithin<SimInfo, UnknownDataException>(keys);
+}
+
+TEST(SimInfo, WhateverTheServiceSendsForAFileIsShownUnderItsKey) {
+    std::vector<std::string> files;
+    for (const auto& row : kFilesToKeys) {
+        files.emplace_back(row.first);
+    }
+    EXPECT_TRUE(rc::check([&files] {
+        RecordFixture<SimInfo> fixture;
+        const PropertyList root = anyPropertyList(files);
+        fixture.feed(propertyListRecord(kSimFiles, root));
+        Dictionary expected;
+        for (const auto& [file, key] : kFilesToKeys) {
+            const DictionaryRef sent = root.dictionary();
+            if (sent != nullptr && sent->contains(file)) {
+                expected.set(key, *sent->find(file));
+            }
+        }
+        RC_CLASSIFY(!expected.empty());
+        RC_ASSERT(sameInOrder(fixture.keys(), expected));
+    }));
 }
 
 } // namespace

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Records/ArrayLock.h"
 #include "LogGenerator/Records/Exceptions.h"
+#include "tests/doubles/ArrayLockHolder.h"
 #include "tests/doubles/RecordingLog.h"
 
 #include <gtest/gtest.h>
@@ -72,15 +73,34 @@ TEST(Base, ARecordWithoutASectionOfItsKindWritesNothing) {
     EXPECT_EQ(keys, PropertyList(Dictionary{{"Key", "kept"}}));
 }
 
-TEST(Base, ListsAreEmptiedAndRefilledUnderTheArrayLock) {
+TEST(Base, ListsAreEmptiedAndRefilledInPlace) {
     Example record;
     const PropertyList list = Array{"old", "older"};
     record.updateSectionRef(list);
     record.replaceList({"new"});
-    EXPECT_EQ(list, PropertyList(Array{"new"})) << "in place: the display shares the array";
+    EXPECT_EQ(list, PropertyList(Array{"new"})) << "the display shares the array";
     record.clearList();
     EXPECT_EQ(list, PropertyList(Array{}));
+}
+
+/// The operation waits for the array lock and changes the list only then.
+template <class Operation>
+void expectToWaitForTheLock(const Operation& operation, const PropertyList& list,
+                            const Array& afterwards) {
+    const PropertyList before = list.shallowCopy();
+    EXPECT_FALSE(doubles::finishesUnderHeldArrayLock(doubles::kExpectedToWait, operation, [&] {
+        EXPECT_EQ(list, before) << "nothing changes while another holds the lock";
+    }));
+    EXPECT_EQ(list, PropertyList(afterwards));
     EXPECT_EQ(ArrayLock::depth(), 0) << "the lock is given back";
+}
+
+TEST(Base, ListsAreEmptiedAndRefilledUnderTheArrayLock) {
+    Example record;
+    const PropertyList list = Array{"old", "older"};
+    record.updateSectionRef(list);
+    expectToWaitForTheLock([&record] { record.replaceList({"new"}); }, list, {"new"});
+    expectToWaitForTheLock([&record] { record.clearList(); }, list, {});
 }
 
 TEST(Base, AnUnknownCodeIsLoggedInDecimal) {

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/BLER.h"
 
+#include "tests/doubles/ArrayLockHolder.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
 
@@ -82,6 +83,13 @@ TEST(BLER, TheListStopsAtTheFirstChannelThatIsNotWhole) {
             ByteBuffer(bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(length)));
         EXPECT_EQ(channelCount(fixture), (length - 16) / 9) << "cut at " << length;
     }
+}
+
+TEST(BLER, TheArrayIsReplacedWithoutTheArrayLock) {
+    RecordFixture<BLER> fixture;
+    EXPECT_TRUE(finishesUnderHeldArrayLock(
+        kExpectedToFinish, [&fixture] { fixture.feed(twoChannels()); }, [] {}));
+    EXPECT_NE(fixture.keys().find("Transport Channels"), nullptr);
 }
 
 TEST(BLER, A15BytePacketChangesNothing) {

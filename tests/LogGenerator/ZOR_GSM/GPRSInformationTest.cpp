@@ -176,6 +176,16 @@ TEST(GPRSInformation, APacketOneByteTooShortChangesNothing) {
     cutAtEveryLength<GPRSInformation>(Record(0x7135).padTo(32), 32);
 }
 
+TEST(GPRSInformation, LogsItsLineOnEveryAcceptedPacket) {
+    RecordFixture<GPRSInformation> fixture;
+    for (const LogCode logCode : fixture.subscriptions()) {
+        const std::size_t before = fixture.keys().size();
+        fixture.feed(Record(logCode).padTo(40));
+        EXPECT_EQ(fixture.lines, (Lines{{4, "GPRSInformation"}})) << std::hex << logCode;
+        EXPECT_GT(fixture.keys().size(), before) << std::hex << logCode << " was not accepted";
+    }
+}
+
 TEST(GPRSInformation, KeysPersistUntilTheyAreOverwritten) {
     RecordFixture<GPRSInformation> fixture;
     fixture.feed(control(0, 7, 0));

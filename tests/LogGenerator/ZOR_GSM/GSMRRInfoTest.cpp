@@ -114,7 +114,8 @@ TEST(GSMRRInfo, APacketOneByteTooShortChangesNothing) {
 
 TEST(GSMRRInfo, LogsItsLineOnEveryCall) {
     RecordFixture<GSMRRInfo> fixture;
-    for (const Record& record : {state(5), Record(0x512C), measurement()}) {
+    for (const Record& record : {state(5), Record(0x512C), measurement(), Record(0x5072).padTo(20),
+                                 Record(0x51F6).padTo(24)}) {
         fixture.feed(record);
         EXPECT_EQ(fixture.lines, (Lines{{4, "GSMRRInfo"}}));
     }

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/GSMServingCell.h"
 
+#include "LogGenerator/ZOR_GSM/GSMRRInfo.h"
 #include "tests/doubles/CellBuilder.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
@@ -52,6 +53,33 @@ TEST(GSMServingCell, BytesFEFFFFFFShowC1As65534TheUnsignedLowHalf) {
 TEST(GSMServingCell, TheDedicatedChannelIsTheLowByteOfItsField) {
     expectInOrder(sectionAfter<GSMServingCell>(Record(0x5076).u16(0x01FE).padTo(17)),
                   Dictionary{{"MA Dedicated ARFCN", "254"}});
+}
+
+TEST(GSMServingCell, LogsItsLineOnEveryAcceptedPacket) {
+    RecordFixture<GSMServingCell> fixture;
+    for (const Record& record : {identity(), measurement(), Record(0x5076).u16(1).padTo(17)}) {
+        fixture.feed(record);
+        EXPECT_EQ(fixture.lines, (Lines{{4, "GSMServingCell"}}));
+    }
+    EXPECT_EQ(fixture.keys().size(), 7U) << "all three were accepted";
+}
+
+/// C1 and C2 in one record are the quality words of the other.
+TEST(GSMServingCell, C1AndC2AreTheRxQualityOfGSMRRInfoReadWithAnotherWidthAndSign) {
+    RecordFixture<GSMServingCell> cell;
+    RecordFixture<GSMRRInfo> state;
+    const Record packet = Record(0x5137)
+                              .padTo(15)
+                              .u8(95)
+                              .append({0xFE, 0xFF, 0xFF, 0xFF, 0x70, 0x11, 1, 0})
+                              .padTo(29);
+    cell.feed(packet);
+    state.feed(packet);
+    expectInOrder(cell.section(),
+                  Dictionary{{"RSSI", "95 dBm"}, {"C1 Value", "65534"}, {"C2 Value", "4464"}});
+    expectInOrder(state.section(), Dictionary{{"Serving Rx Level", "95"},
+                                              {"Rx Quality Full", "-2"},
+                                              {"Rx Quality Sub", "70000"}});
 }
 
 TEST(GSMServingCell, APacketOneByteTooShortChangesNothing) {

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/HSDPAInformation.h"
 
+#include "tests/doubles/ArrayLockHolder.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
 
@@ -133,6 +134,13 @@ TEST(HSDPAInformation, TheArraysAreReplacedByNewOnes) {
         << "who held the one before keeps it as it was";
     EXPECT_EQ(*secondary, Array{process("5", "1", "2", "3")});
     EXPECT_EQ(*fixture.keys().find(kPrimary), PropertyList(Array{process("0", "0", "0", "0")}));
+}
+
+TEST(HSDPAInformation, TheArraysAreReplacedWithoutTheArrayLock) {
+    RecordFixture<HSDPAInformation> fixture;
+    EXPECT_TRUE(finishesUnderHeldArrayLock(
+        kExpectedToFinish, [&fixture] { fixture.feed(oneOfEach()); }, [] {}));
+    EXPECT_NE(fixture.keys().find(kSecondary), nullptr);
 }
 
 TEST(HSDPAInformation, TheListsStopAtTheFirstEntryThatIsNotWhole) {

@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/ProcessCO.h"
 
 #include "tests/doubles/RecordFixture.h"
+#include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
 
@@ -89,6 +90,10 @@ TEST(ProcessCO, AnyOtherCodeIsUnknownAndChangesNothing) {
 TEST(ProcessCO, A15BytePacketOfAnySubscribedCodeChangesNothing) {
     cutAtEveryLength<ProcessCO>(state(19), 16);
     cutAtEveryLength<ProcessCO>(Record(0x7132).u8(1).padTo(16), 16);
+}
+
+TEST(ProcessCO, AnyBytesKeepWithinItsKeys) {
+    anyBytesKeepWithin<ProcessCO>({"MM Service State", "MM State"});
 }
 
 } // namespace

@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/ProcessPS.h"
 
 #include "tests/doubles/RecordFixture.h"
+#include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
 
@@ -82,20 +83,29 @@ TEST(ProcessPS, EveryStateSubStateAndRejectCauseHasItsLabel) {
 TEST(ProcessPS, ShowsTheRegistrationState) {
     expectInOrder(sectionAfter<ProcessPS>(Record(0x7132).u8(6).padTo(16)),
                   Dictionary{{"MM Service State", "REG_STATE_OFFLINE"}});
+    expectInOrder(sectionAfter<ProcessPS>(Record(0x7132).u8(7).padTo(16)),
+                  Dictionary{{"MM Service State", "Unknown"}});
 }
 
 TEST(ProcessPS, LogsItsLineAndUnknownCodes) {
     RecordFixture<ProcessPS> fixture;
     fixture.feed(state(3, 0, 0));
     EXPECT_EQ(fixture.lines, (Lines{{4, "ProcessPS"}}));
+    const PropertyList before = fixture.snapshot();
     fixture.feed(Record(0x7131).padTo(16));
     EXPECT_EQ(fixture.lines,
               (Lines{{4, "ProcessPS"}, {3, "Received an unknown log message: 28977"}}));
+    EXPECT_EQ(fixture.section(), before);
 }
 
 TEST(ProcessPS, A15BytePacketOfAnySubscribedCodeChangesNothing) {
     cutAtEveryLength<ProcessPS>(state(3, 0, 0), 16);
     cutAtEveryLength<ProcessPS>(Record(0x7132).u8(1).padTo(16), 16);
+}
+
+TEST(ProcessPS, AnyBytesKeepWithinItsKeys) {
+    anyBytesKeepWithin<ProcessPS>(
+        {"MM Service State", "MM State", "MM Sub State", "Attach Reject Cause"});
 }
 
 } // namespace

@@ -98,6 +98,15 @@ TEST(ServingPLMN, A31ByteNetworkPacketChangesNothing) {
     EXPECT_TRUE(fixture.keys().empty());
 }
 
+TEST(ServingPLMN, LogsItsLineOnEveryAcceptedPacket) {
+    RecordFixture<ServingPLMN> fixture;
+    for (const Record& record : {network(), selection(1)}) {
+        fixture.feed(record);
+        EXPECT_EQ(fixture.lines, (Lines{{4, "Serving PLMN"}}));
+    }
+    EXPECT_EQ(fixture.keys().size(), 6U) << "both were accepted";
+}
+
 // 0x7132
 
 TEST(ServingPLMN, EverySelectionModeHasItsLabel) {

@@ -4,6 +4,7 @@
 #include "LogGenerator/ZOR_GSM/NonRankedUMTSSet.h"
 #include "LogGenerator/ZOR_GSM/UMTSRRMeasurement.h"
 #include "tests/doubles/RecordFixture.h"
+#include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
 
@@ -43,6 +44,15 @@ TEST(SilentRecords, NonRankedGSMSet) {
 
 TEST(SilentRecords, NonRankedUMTSSet) {
     expectSilent<NonRankedUMTSSet>("Non-Ranked UMTS Set", "NonRankedUMTSSet");
+}
+
+TEST(SilentRecords, AnyBytesUnderAnyCodeLeaveNoKey) {
+    const std::vector<LogCode> codes = {0x5137, 0x417A, 0x4005, 0xFF0001, 0x0000};
+    anyBytesKeepWithin<CodingScheme>({}, codes);
+    anyBytesKeepWithin<CellChangeCounters>({}, codes);
+    anyBytesKeepWithin<UMTSRRMeasurement>({}, codes);
+    anyBytesKeepWithin<NonRankedGSMSet>({}, codes);
+    anyBytesKeepWithin<NonRankedUMTSSet>({}, codes);
 }
 
 } // namespace

@@ -1,5 +1,5 @@
 #include "LogGenerator/ZOR_GSM/UMTSRRInfo.h"
-#include "tests/doubles/PropertyListRecord.h"
+#include "tests/doubles/CellBuilder.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
 
@@ -11,36 +11,16 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-constexpr LogCode kCellMonitor = 0xFF0001;
-
-PropertyList number(std::int64_t value) {
-    return PropertyList::integer(value);
-}
-
-Dictionary serving(std::int64_t cellId, std::int64_t uarfcn, std::int64_t code) {
-    return {{"kHXCellMonitorSCN", number(code)},
-            {"kHXCellMonitorUARFCN", number(uarfcn)},
-            {"kHXCellMonitorCellId", number(cellId)},
-            {"kHXCellMonitorCellType", "kHXCellMonitorCellTypeServing"},
-            {"kHXCellMonitorCellRadioAccessTechnology", "kHXCellMonitorRadioAccessTechnologyUMTS"}};
-}
-
-Dictionary with(Dictionary cell, const char* key, PropertyList value) {
-    cell.set(key, std::move(value));
-    return cell;
-}
-
-Record monitored(const PropertyList& root) {
-    return propertyListRecord(kCellMonitor, root);
+PropertyList serving(std::int64_t cellId, std::int64_t uarfcn, std::int64_t code) {
+    return cell("UMTS", "Serving", {{"SCN", code}, {"UARFCN", uarfcn}, {"CellId", cellId}});
 }
 
 TEST(UMTSRRInfoCellMonitor, ShowsTheFirstUMTSServingCellWithItsKeysInOrder) {
-    const Dictionary neighbour =
-        with(serving(1, 2, 3), "kHXCellMonitorCellType", "kHXCellMonitorCellTypeNeighbor");
-    const Dictionary gsm = with(serving(4, 5, 6), "kHXCellMonitorCellRadioAccessTechnology",
-                                "kHXCellMonitorRadioAccessTechnologyGSM");
+    const PropertyList neighbour =
+        cell("UMTS", "Neighbor", {{"CellId", 1}, {"UARFCN", 2}, {"SCN", 3}});
+    const PropertyList gsm = cell("GSM", "Serving", {{"CellId", 4}, {"UARFCN", 5}, {"SCN", 6}});
     RecordFixture<UMTSRRInfo> fixture;
-    fixture.feed(monitored(
+    fixture.feed(cellsRecord(
         Array{neighbour, "no cell", gsm, serving(123456789, 10713, 388), serving(7, 8, 9)}));
     EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"}}));
     expectInOrder(
@@ -51,7 +31,7 @@ TEST(UMTSRRInfoCellMonitor, ShowsTheFirstUMTSServingCellWithItsKeysInOrder) {
 
 TEST(UMTSRRInfoCellMonitor, NumbersAreSigned32BitIntegers) {
     RecordFixture<UMTSRRInfo> fixture;
-    fixture.feed(monitored(Array{serving(-2147483648, 2147483647, 32767)}));
+    fixture.feed(cellsRecord(Array{serving(-2147483648, 2147483647, 32767)}));
     expectInOrder(fixture.section(), Dictionary{{"Cell ID", "-2147483648"},
                                                 {"UARFCN", "2147483647"},
                                                 {"Scrambling Code", "32767"}});
@@ -66,10 +46,10 @@ TEST(UMTSRRInfoCellMonitor, AMissingNumberIsLoggedAndLeavesItsKeyAsItWas) {
     };
     for (const auto& [constant, key, line] : numbers) {
         RecordFixture<UMTSRRInfo> fixture;
-        fixture.feed(monitored(Array{serving(1, 1, 1)}));
-        Dictionary cell = serving(2, 2, 2);
-        cell.remove(constant);
-        fixture.feed(monitored(Array{cell}));
+        fixture.feed(cellsRecord(Array{serving(1, 1, 1)}));
+        const PropertyList partial = serving(2, 2, 2);
+        partial.dictionary()->remove(constant);
+        fixture.feed(cellsRecord(Array{partial}));
         EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"}, {3, line}}));
         for (const char* each : {"Cell ID", "UARFCN", "Scrambling Code"}) {
             EXPECT_EQ(fixture.text(each), std::string_view(each) == key ? "1" : "2");
@@ -78,11 +58,11 @@ TEST(UMTSRRInfoCellMonitor, AMissingNumberIsLoggedAndLeavesItsKeyAsItWas) {
 }
 
 TEST(UMTSRRInfoCellMonitor, ANumberThatIsNo32BitIntegerCountsAsMissing) {
-    Dictionary cell = serving(std::int64_t{1} << 31U, 0, 0);
-    cell.set("kHXCellMonitorUARFCN", "10713");
-    cell.set("kHXCellMonitorSCN", PropertyList::real(0.5));
+    const PropertyList odd = serving(std::int64_t{1} << 31U, 0, 0);
+    odd.dictionary()->set("kHXCellMonitorUARFCN", "10713");
+    odd.dictionary()->set("kHXCellMonitorSCN", PropertyList::real(0.5));
     RecordFixture<UMTSRRInfo> fixture;
-    fixture.feed(monitored(Array{cell, serving(1, 2, 3)}));
+    fixture.feed(cellsRecord(Array{odd, serving(1, 2, 3)}));
     EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"},
                                     {3, "UMTSRRInfo: Failed to retrieve Cell ID\n"},
                                     {3, "UMTSRRInfo: Failed to retrieve UARFCN\n"},
@@ -93,13 +73,13 @@ TEST(UMTSRRInfoCellMonitor, ANumberThatIsNo32BitIntegerCountsAsMissing) {
 TEST(UMTSRRInfoCellMonitor, ABrokenPropertyListLogsTwoLinesAndChangesNothing) {
     // The text form, of which no beginning is a property list of its own.
     constexpr std::string_view kCells = "( { kHXCellMonitorCellId = 1; } )";
-    const ByteBuffer whole = textRecord(kCellMonitor, kCells).bytes();
+    const ByteBuffer whole = textRecord(kCellMonitorLogCode, kCells).bytes();
     RecordFixture<UMTSRRInfo> fixture;
-    fixture.feed(monitored(Array{serving(7, 8, 9)}));
+    fixture.feed(cellsRecord(Array{serving(7, 8, 9)}));
     const PropertyList before = fixture.snapshot();
     for (std::size_t length = 0; length < whole.size(); ++length) {
         fixture.feed(ByteBuffer(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(length)),
-                     kCellMonitor);
+                     kCellMonitorLogCode);
         EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"},
                                         {3, "Cell Info Array data could not be constructed"},
                                         {3, "Failed to get Cell Array\n"}}))
@@ -109,12 +89,12 @@ TEST(UMTSRRInfoCellMonitor, ABrokenPropertyListLogsTwoLinesAndChangesNothing) {
 }
 
 TEST(UMTSRRInfoCellMonitor, NoElementsAndNoUMTSServingCellChangeNothingSilently) {
-    const Dictionary neighbour =
-        with(serving(1, 2, 3), "kHXCellMonitorCellType", "kHXCellMonitorCellTypeNeighbor");
+    const PropertyList neighbour =
+        cell("UMTS", "Neighbor", {{"CellId", 1}, {"UARFCN", 2}, {"SCN", 3}});
     RecordFixture<UMTSRRInfo> fixture;
     for (const PropertyList& root :
-         {PropertyList(Array()), PropertyList(Array{neighbour}), PropertyList(serving(1, 2, 3))}) {
-        fixture.feed(monitored(root));
+         {PropertyList(Array()), PropertyList(Array{neighbour}), serving(1, 2, 3)}) {
+        fixture.feed(propertyListRecord(kCellMonitorLogCode, root));
         EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"}}));
         EXPECT_TRUE(fixture.keys().empty());
     }
@@ -123,7 +103,7 @@ TEST(UMTSRRInfoCellMonitor, NoElementsAndNoUMTSServingCellChangeNothingSilently)
 TEST(UMTSRRInfoCellMonitor, TheUARFCNIsShownOnlyUntilTheNext0x4127) {
     const Record identity = Record(0x4127).s32(9763).s32(10713).s32(42).u16(7).padTo(29);
     RecordFixture<UMTSRRInfo> fixture;
-    fixture.feed(monitored(Array{serving(41, 10713, 388)}));
+    fixture.feed(cellsRecord(Array{serving(41, 10713, 388)}));
     fixture.feed(ByteBuffer(identity.bytes().begin(), identity.bytes().end() - 1));
     EXPECT_EQ(fixture.text("UARFCN"), "10713") << "a short 0x4127 removes nothing";
     fixture.feed(identity);
@@ -132,7 +112,7 @@ TEST(UMTSRRInfoCellMonitor, TheUARFCNIsShownOnlyUntilTheNext0x4127) {
                                                 {"Downlink Frequency", "10713"},
                                                 {"Uplink Frequency", "9763"},
                                                 {"URA ID", "7"}});
-    fixture.feed(monitored(Array{serving(41, 10688, 388)}));
+    fixture.feed(cellsRecord(Array{serving(41, 10688, 388)}));
     EXPECT_EQ(fixture.text("UARFCN"), "10688");
     EXPECT_EQ(fixture.text("Cell ID"), "41");
     EXPECT_EQ(fixture.text("URA ID"), "7");

@@ -1,5 +1,5 @@
 #include "LogGenerator/ZOR_GSM/UMTSSet.h"
-#include "tests/doubles/PropertyListRecord.h"
+#include "tests/doubles/CellBuilder.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
 
@@ -11,45 +11,21 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-constexpr LogCode kCellMonitor = 0xFF0001;
-
-PropertyList number(std::int64_t value) {
-    return PropertyList::integer(value);
-}
-
-/// A UMTS neighbour without any number.
-Dictionary neighbour() {
-    return {{"kHXCellMonitorCellRadioAccessTechnology", "kHXCellMonitorRadioAccessTechnologyUMTS"},
-            {"kHXCellMonitorCellType", "kHXCellMonitorCellTypeNeighbor"}};
-}
-
-Dictionary neighbour(std::int64_t uarfcn, std::int64_t code, std::int64_t rscp,
-                     std::int64_t energy) {
-    Dictionary cell = neighbour();
-    cell.set("kHXCellMonitorECN0", number(energy));
-    cell.set("kHXCellMonitorRSCP", number(rscp));
-    cell.set("kHXCellMonitorSCN", number(code));
-    cell.set("kHXCellMonitorUARFCN", number(uarfcn));
-    return cell;
-}
-
-Dictionary with(Dictionary cell, const char* key, PropertyList value) {
-    cell.set(key, std::move(value));
-    return cell;
+PropertyList neighbour(std::int64_t uarfcn, std::int64_t code, std::int64_t rscp,
+                       std::int64_t energy) {
+    return cell("UMTS", "Neighbor",
+                {{"ECN0", energy}, {"RSCP", rscp}, {"SCN", code}, {"UARFCN", uarfcn}});
 }
 
 TEST(UMTSSetCellMonitor, ShowsEveryUMTSNeighbourInOrderAndNothingElse) {
-    const Dictionary serving =
-        with(neighbour(1, 2, 3, 4), "kHXCellMonitorCellType", "kHXCellMonitorCellTypeServing");
-    const Dictionary gsm = with(neighbour(1, 2, 3, 4), "kHXCellMonitorCellRadioAccessTechnology",
-                                "kHXCellMonitorRadioAccessTechnologyGSM");
-    Dictionary untyped = neighbour(1, 2, 3, 4);
-    untyped.remove("kHXCellMonitorCellType");
+    const PropertyList serving = cell("UMTS", "Serving", {{"UARFCN", 1}, {"SCN", 2}});
+    const PropertyList gsm = cell("GSM", "Neighbor", {{"UARFCN", 1}, {"SCN", 2}});
+    const PropertyList untyped = neighbour(1, 2, 3, 4);
+    untyped.dictionary()->remove("kHXCellMonitorCellType");
     RecordFixture<UMTSSet> fixture;
     fixture.list() = Array{"what was shown before"};
-    fixture.feed(
-        propertyListRecord(kCellMonitor, Array{serving, neighbour(10713, 388, -95, -7), gsm,
-                                               "no cell", untyped, neighbour(10688, 1, 0, 0)}));
+    fixture.feed(cellsRecord(Array{serving, neighbour(10713, 388, -95, -7), gsm, "no cell", untyped,
+                                   neighbour(10688, 1, 0, 0)}));
     EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSSet"}}));
     ASSERT_EQ(fixture.list().size(), 2U);
     expectInOrder(fixture.list()[0], Dictionary{{"UARFCN", "10713"},
@@ -64,9 +40,8 @@ TEST(UMTSSetCellMonitor, ShowsEveryUMTSNeighbourInOrderAndNothingElse) {
 
 TEST(UMTSSetCellMonitor, RSCPNumber32767ShowsTheEmptyStringAndSoDoesTheEnergy) {
     RecordFixture<UMTSSet> fixture;
-    fixture.feed(propertyListRecord(kCellMonitor,
-                                    Array{neighbour(1, 2, 32767, -7), neighbour(1, 2, -95, 32767),
-                                          neighbour(32767, 32767, 98303, 98303)}));
+    fixture.feed(cellsRecord(Array{neighbour(1, 2, 32767, -7), neighbour(1, 2, -95, 32767),
+                                   neighbour(32767, 32767, 98303, 98303)}));
     EXPECT_EQ(fixture.list(), (Array{Dictionary{{"UARFCN", "1"},
                                                 {"Scrambling Code", "2"},
                                                 {"RSCP", ""},
@@ -83,8 +58,7 @@ TEST(UMTSSetCellMonitor, RSCPNumber32767ShowsTheEmptyStringAndSoDoesTheEnergy) {
 
 TEST(UMTSSetCellMonitor, ALevelIsTheLow16BitsSigned) {
     RecordFixture<UMTSSet> fixture;
-    fixture.feed(propertyListRecord(kCellMonitor,
-                                    Array{neighbour(-2147483648, 2147483647, 65536 - 95, -32768)}));
+    fixture.feed(cellsRecord(Array{neighbour(-2147483648, 2147483647, 65536 - 95, -32768)}));
     EXPECT_EQ(fixture.list(), (Array{Dictionary{{"UARFCN", "-2147483648"},
                                                 {"Scrambling Code", "2147483647"},
                                                 {"RSCP", "-95 dBm"},
@@ -98,8 +72,7 @@ TEST(UMTSSetCellMonitor, RSCPIsIn_dB_From0x4005AndIn_dBm_FromTheCellMonitor) {
         return *fixture.list().at(0).dictionary()->find("RSCP");
     };
     const PropertyList ranked = rscp(Record(0x4005).u8(1).u8(0).u32(0).s8(-74).padTo(25));
-    const PropertyList monitored =
-        rscp(propertyListRecord(kCellMonitor, Array{neighbour(1, 2, -95, -7)}));
+    const PropertyList monitored = rscp(cellsRecord(Array{neighbour(1, 2, -95, -7)}));
     EXPECT_EQ(ranked.string(), "-95 dB");
     EXPECT_EQ(monitored.string(), "-95 dBm");
     EXPECT_EQ(ranked.displayNumber()->unit(), "dB");
@@ -108,10 +81,10 @@ TEST(UMTSSetCellMonitor, RSCPIsIn_dB_From0x4005AndIn_dBm_FromTheCellMonitor) {
 
 TEST(UMTSSetCellMonitor, EveryMissingNumberIsLoggedAndLeftOutAndTheCellIsShownAllTheSame) {
     const auto without = [](const char* key) {
-        Dictionary cell = neighbour(10713, 388, -95, -7);
-        cell.remove(key);
+        const PropertyList partial = neighbour(10713, 388, -95, -7);
+        partial.dictionary()->remove(key);
         RecordFixture<UMTSSet> fixture;
-        fixture.feed(propertyListRecord(kCellMonitor, Array{cell}));
+        fixture.feed(cellsRecord({partial}));
         EXPECT_EQ(fixture.list().size(), 1U);
         return std::pair(fixture.lines, fixture.list().at(0).dictionary());
     };
@@ -130,12 +103,11 @@ TEST(UMTSSetCellMonitor, EveryMissingNumberIsLoggedAndLeftOutAndTheCellIsShownAl
 }
 
 TEST(UMTSSetCellMonitor, ANumberThatIsNo32BitIntegerCountsAsMissing) {
-    Dictionary cell = neighbour();
-    cell.set("kHXCellMonitorUARFCN", "10713");
-    cell.set("kHXCellMonitorSCN", number(std::int64_t{1} << 31U));
-    cell.set("kHXCellMonitorRSCP", PropertyList::real(-95.5));
+    const PropertyList odd = cell("UMTS", "Neighbor", {{"SCN", std::int64_t{1} << 31U}});
+    odd.dictionary()->set("kHXCellMonitorUARFCN", "10713");
+    odd.dictionary()->set("kHXCellMonitorRSCP", PropertyList::real(-95.5));
     RecordFixture<UMTSSet> fixture;
-    fixture.feed(propertyListRecord(kCellMonitor, Array{cell}));
+    fixture.feed(cellsRecord({odd}));
     EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSSet"},
                                     {3, "UMTSSet: Failed to retrieve UARFCN\n"},
                                     {3, "UMTSSet: Failed to retrieve Scrambling Code\n"},
@@ -147,12 +119,12 @@ TEST(UMTSSetCellMonitor, ANumberThatIsNo32BitIntegerCountsAsMissing) {
 TEST(UMTSSetCellMonitor, ABrokenPropertyListEmptiesTheListAndLogsTwoLines) {
     // The text form, of which no beginning is a property list of its own.
     constexpr std::string_view kCells = "( { kHXCellMonitorUARFCN = 1; } )";
-    const ByteBuffer whole = textRecord(kCellMonitor, kCells).bytes();
+    const ByteBuffer whole = textRecord(kCellMonitorLogCode, kCells).bytes();
     for (std::size_t length = 0; length < whole.size(); ++length) {
         RecordFixture<UMTSSet> fixture;
         fixture.list() = Array{"what was shown before"};
         fixture.feed(ByteBuffer(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(length)),
-                     kCellMonitor);
+                     kCellMonitorLogCode);
         EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSSet"},
                                         {3, "Cell Info Array data could not be constructed"},
                                         {3, "Failed to get Cell Array\n"}}))
@@ -162,11 +134,11 @@ TEST(UMTSSetCellMonitor, ABrokenPropertyListEmptiesTheListAndLogsTwoLines) {
 }
 
 TEST(UMTSSetCellMonitor, AnArrayWithoutUMTSNeighboursAndARootThatIsNoArrayEmptyTheList) {
-    for (const PropertyList& root : {PropertyList(Array()), PropertyList(Array{"no cell"}),
-                                     PropertyList(neighbour(1, 2, 3, 4))}) {
+    for (const PropertyList& root :
+         {PropertyList(Array()), PropertyList(Array{"no cell"}), neighbour(1, 2, 3, 4)}) {
         RecordFixture<UMTSSet> fixture;
         fixture.list() = Array{"what was shown before"};
-        fixture.feed(propertyListRecord(kCellMonitor, root));
+        fixture.feed(propertyListRecord(kCellMonitorLogCode, root));
         EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSSet"}}));
         EXPECT_TRUE(fixture.list().empty());
     }
@@ -174,7 +146,7 @@ TEST(UMTSSetCellMonitor, AnArrayWithoutUMTSNeighboursAndARootThatIsNoArrayEmptyT
 
 TEST(UMTSSetCellMonitor, WhicheverOfTheTwoCodesCameLastIsShown) {
     const Record ranked = Record(0x4005).u8(1).u8(0).padTo(25);
-    const Record monitored = propertyListRecord(kCellMonitor, Array{neighbour(1, 2, 3, 4)});
+    const Record monitored = cellsRecord(Array{neighbour(1, 2, 3, 4)});
     RecordFixture<UMTSSet> fixture;
     fixture.feed(ranked);
     fixture.feed(monitored);

@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
 
 #include "tests/doubles/FakeStandardOutput.h"
+#include "tests/doubles/RecordingLog.h"
 #include "tests/doubles/TemplateCheck.h"
 
 #include <gtest/gtest.h>
@@ -9,6 +10,7 @@ namespace pallax {
 namespace {
 
 using doubles::FakeStandardOutput;
+using doubles::RecordingLog;
 using Names = std::vector<std::string>;
 
 /// Who gets the packets of a log code, in call order.
@@ -110,6 +112,19 @@ TEST_F(ZOR_GSMClassIndexTest, ItHolds26Sections) {
 TEST_F(ZOR_GSMClassIndexTest, TemplateAndRecordsMatchBothWays) {
     doubles::expectTemplateMatches(
         doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"), _index);
+}
+
+TEST(ZOR_GSMClassIndex, ItsRecordsRegisterInTheirOrder) {
+    FakeStandardOutput output;
+    const RecordingLog log;
+    const ZOR_GSMClassIndex index(output);
+    std::vector<RecordingLog::Line> expected;
+    // How many codes each record wants, from ActiveSet to HSDPAInformation.
+    for (const int count :
+         {1, 0, 7, 4, 1, 3, 1, 2, 0, 0, 1, 1, 0, 2, 3, 2, 1, 4, 1, 0, 2, 5, 1, 1, 1, 1}) {
+        expected.push_back({4, "Array Count: " + std::to_string(count)});
+    }
+    EXPECT_EQ(log.lines(), expected);
 }
 
 TEST(ZOR_GSMClassIndex, ItsEndIsPrintedBeforeThatOfItsBase) {

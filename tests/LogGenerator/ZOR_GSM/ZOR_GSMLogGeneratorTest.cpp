@@ -3,6 +3,7 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "platform/TelephonyConstants.h"
 #include "tests/doubles/GeneratorFixture.h"
+#include "tests/doubles/PropertyListRecord.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/TemplateCheck.h"
 
@@ -16,6 +17,12 @@ using doubles::Record;
 using doubles::RecordingLog;
 using Lines = std::vector<RecordingLog::Line>;
 
+/// The modem's codes that some record wants, ascending.
+constexpr auto kEveryCode =
+    std::to_array<LogCode>({0x4005, 0x4031, 0x4116, 0x4125, 0x4127, 0x4157, 0x417A, 0x4221, 0x5072,
+                            0x5076, 0x512C, 0x5134, 0x5137, 0x51F4, 0x51F5, 0x51F6, 0x51F8, 0x51FB,
+                            0x51FD, 0x51FF, 0x7130, 0x7131, 0x7132, 0x7135, 0x7150});
+
 TEST(ZOR_GSMLogGenerator, ItsLifeIsLoggedWithTheDestructionTwice) {
     GeneratorFixture fixture;
     RecordingLog log;
@@ -24,7 +31,7 @@ TEST(ZOR_GSMLogGenerator, ItsLifeIsLoggedWithTheDestructionTwice) {
     const Lines created = log.take();
     ASSERT_GE(created.size(), 4U);
     EXPECT_EQ(created.front(), (RecordingLog::Line{3, "Creating ZOR_GSMLogGenerator object"}));
-    EXPECT_EQ(created[1].text.substr(0, 13), "Array Count: ") << "then the records register";
+    EXPECT_EQ(created[1], (RecordingLog::Line{4, "Array Count: 1"})) << "then the records register";
     EXPECT_EQ(created[created.size() - 3].text.substr(0, 38),
               "Creating ZORLogGenerator2 object with ");
     EXPECT_EQ(created[created.size() - 3].priority, 3);
@@ -56,10 +63,7 @@ TEST(ZOR_GSMLogGenerator, TheStartCommandHoldsExactlyTheCodesOfItsRecords) {
     GeneratorFixture fixture;
     const auto generator = ZOR_GSMLogGenerator::generator(fixture.environment());
     Array codes;
-    for (const LogCode logCode :
-         {0x4005, 0x4031, 0x4116, 0x4125, 0x4127, 0x4157, 0x417A, 0x4221, 0x5072,
-          0x5076, 0x512C, 0x5134, 0x5137, 0x51F4, 0x51F5, 0x51F6, 0x51F8, 0x51FB,
-          0x51FD, 0x51FF, 0x7130, 0x7131, 0x7132, 0x7135, 0x7150}) {
+    for (const LogCode logCode : kEveryCode) {
         codes.push_back(PropertyList::integer(logCode));
     }
     const Array extraCodes = {PropertyList::integer(0), PropertyList::integer(1),
@@ -70,16 +74,9 @@ TEST(ZOR_GSMLogGenerator, TheStartCommandHoldsExactlyTheCodesOfItsRecords) {
                                       {"SetHxExtraCodes", extraCodes}});
 }
 
-TEST(ZOR_GSMLogGenerator, SectionsWithoutACodeExistFromTheStartAndNeverChange) {
-    GeneratorFixture fixture;
-    fixture.resources.add("ZOR_GSM",
-                          doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"));
-    const auto generator = ZOR_GSMLogGenerator::generator(fixture.environment());
-    Dictionary state;
-    for (const unsigned logCode : {0x7130U, 0x5137U, 0x417AU, 0x4005U, 0x1234U}) {
-        generator->updateState(state, Record(logCode).padTo(200).bytes());
-    }
+void expectSilentSectionsEmpty(Dictionary& state) {
     const DictionaryRef display = state.find("Display")->dictionary();
+    ASSERT_NE(display, nullptr);
     ASSERT_EQ(display->size(), 26U);
     for (const char* section : {"Coding Scheme", "Cell Change Counters", "UMTS RR Measurement"}) {
         EXPECT_EQ(*display->find(section), PropertyList(Dictionary())) << section;
@@ -87,6 +84,48 @@ TEST(ZOR_GSMLogGenerator, SectionsWithoutACodeExistFromTheStartAndNeverChange) {
     for (const char* section : {"Non-Ranked GSM Set", "Non-Ranked UMTS Set"}) {
         EXPECT_EQ(*display->find(section), PropertyList(Array())) << section;
     }
+}
+
+TEST(ZOR_GSMLogGenerator, SectionsWithoutACodeExistFromTheStartAndNeverChange) {
+    GeneratorFixture fixture;
+    fixture.resources.add("ZOR_GSM",
+                          doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"));
+    const auto generator = ZOR_GSMLogGenerator::generator(fixture.environment());
+    Dictionary state;
+    generator->updateState(state, Record(0x1234).bytes()); // builds the display, reaches nobody
+    expectSilentSectionsEmpty(state);
+    for (const LogCode logCode : kEveryCode) {
+        generator->updateState(state, Record(logCode).padTo(200).bytes());
+    }
+    for (const LogCode logCode : {kSimFilesLogCode, kCellMonitorLogCode, kPDPContextsLogCode}) {
+        generator->updateState(state, doubles::propertyListRecord(logCode, Array()).bytes());
+    }
+    expectSilentSectionsEmpty(state);
+}
+
+/// The lines of a packet to a generator whose display stands.
+Lines linesOf(const Record& record) {
+    GeneratorFixture fixture;
+    fixture.resources.add("ZOR_GSM",
+                          doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"));
+    const auto generator = ZOR_GSMLogGenerator::generator(fixture.environment());
+    Dictionary state;
+    generator->updateState(state, Record(0x1234).bytes());
+    RecordingLog log;
+    generator->updateState(state, record.bytes());
+    return log.take();
+}
+
+TEST(ZOR_GSMLogGenerator, ARegistrationPacketReachesItsFourRecordsInOrder) {
+    EXPECT_EQ(linesOf(Record(0x7132).padTo(16)),
+              (Lines{{4, "ProcessPS"}, {4, "ProcessCS"}, {4, "Serving PLMN"}, {4, "ProcessCS"}}));
+}
+
+TEST(ZOR_GSMLogGenerator, AMeasurementPacketReachesItsFourRecordsInOrder) {
+    EXPECT_EQ(linesOf(Record(0x5137).padTo(29)), (Lines{{4, "GPRSInformation"},
+                                                        {4, "GSMServingCell"},
+                                                        {4, "NeighboringCells"},
+                                                        {4, "GSMRRInfo"}}));
 }
 
 TEST(Technologies, TheGSMIdentifierGivesTheGSMGenerator) {

@@ -1,0 +1,95 @@
+#include "LogGenerator/LogPacket.h"
+#include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
+#include "LogGenerator/ZOR_GSM/ZOR_GSMLogGenerator.h"
+#include "samples/Sample.h"
+#include "tests/doubles/GeneratorFixture.h"
+#include "tests/doubles/RecordingLog.h"
+#include "tests/doubles/TemplateCheck.h"
+
+#include <gtest/gtest.h>
+
+#include <set>
+
+namespace pallax {
+namespace {
+
+using doubles::GeneratorFixture;
+using doubles::RecordingLog;
+
+/// What the records make of the drive, packet by packet.
+class UmtsDrive : public testing::Test {
+protected:
+    UmtsDrive() {
+        _fixture.resources.add(
+            "ZOR_GSM", doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"));
+        _generator = ZOR_GSMLogGenerator::generator(_fixture.environment());
+        (void)_log.take();
+    }
+
+    void feed(const SamplePacket& packet) {
+        _generator->updateState(_state, LogPacketStripPrefix(packet.data));
+    }
+    void feedAll() {
+        for (const SamplePacket& packet : umtsDrivePackets()) {
+            feed(packet);
+        }
+    }
+
+    bool isFilled(std::string_view section) const {
+        const PropertyList* display = _state.find("Display");
+        const PropertyList* value =
+            display != nullptr ? display->dictionary()->find(section) : nullptr;
+        if (value == nullptr) {
+            ADD_FAILURE() << section << " is not in the display";
+            return false;
+        }
+        const ArrayRef list = value->array();
+        return list != nullptr ? !list->empty() : !value->dictionary()->empty();
+    }
+
+    GeneratorFixture _fixture;
+    RecordingLog _log;
+    std::unique_ptr<LogGenerator> _generator;
+    Dictionary _state;
+};
+
+TEST_F(UmtsDrive, InTheEndEverySectionThatAnyPacketFillsIsFilled) {
+    const std::set<std::string_view> alwaysEmpty = {"Monitored Set", "Detected Set",
+                                                    "Virtual Active Set"};
+    feedAll();
+    const ZOR_GSMClassIndex index(_fixture.standardOutput);
+    ASSERT_EQ(index.classes().size(), 26U);
+    for (const auto& [section, record] : index.classes()) {
+        const bool fills = !record->getLogCodeArray().empty() && !alwaysEmpty.contains(section);
+        EXPECT_EQ(isFilled(section), fills) << section;
+    }
+}
+
+TEST_F(UmtsDrive, EveryPacketIsOneThatItsRecordsCanRead) {
+    feedAll();
+    std::size_t warnings = 0;
+    for (const RecordingLog::Line& line : _log.lines()) {
+        EXPECT_NE(line.priority, 3) << line.text;
+        warnings += line.priority == 4 ? 1 : 0;
+    }
+    EXPECT_GT(warnings, umtsDrivePackets().size()) << "each reaches a record at least";
+}
+
+TEST_F(UmtsDrive, TheRankedSetsOfBothTechnologiesShowSideBySideAgainAndAgain) {
+    constexpr std::chrono::seconds kTick{2};
+    Time nextTick = kSampleStart + kTick;
+    int both = 0;
+    int noActiveCell = 0;
+    for (const SamplePacket& packet : umtsDrivePackets()) {
+        for (; packet.time >= nextTick; nextTick += kTick) {
+            both += isFilled("GSM Set") && isFilled("UMTS Set") ? 1 : 0;
+            noActiveCell += isFilled("Active Set") ? 0 : 1;
+        }
+        feed(packet);
+    }
+    EXPECT_GE(both, 10);
+    EXPECT_GE(noActiveCell, 15) << "behind the hill there is none";
+}
+
+} // namespace
+} // namespace pallax
