@@ -49,9 +49,9 @@ int levelMargin_db(const LteCell& cell, int required_dbm) {
     return margin_db > 0 ? margin_db : 0;
 }
 
-constexpr int kRequired_dbm = -124;
-constexpr int kRawRequired = (kRequired_dbm + 140) / 2;
-constexpr int kSrxlevOffset_db = 30;
+constexpr int kRequiredDbm = -124;
+constexpr int kRawRequired = (kRequiredDbm + 140) / 2;
+constexpr int kSrxlevOffsetDb = 30;
 
 Record candidatesHead(const LteCell& serving, unsigned count) {
     return Record(0xB186).u8(1).u8(0).u16(serving.earfcn).u16(serving.physicalCellId).u16(count);
@@ -90,7 +90,7 @@ ByteBuffer idleServingRecord(const LteCell& cell, bool searchesOtherFrequencies)
     packed.put(12, 0, 9, rawRssi(cell));
     packed.put(13, 1, 6, kRawRequired);
     packed.put(13, 7, 7, kPowerClass_dbm + 30).put(14, 6, 6, kPowerClass_dbm + 30);
-    packed.put(16, 0, 7, levelMargin_db(cell, kRequired_dbm) + kSrxlevOffset_db);
+    packed.put(16, 0, 7, levelMargin_db(cell, kRequiredDbm) + kSrxlevOffsetDb);
     packed.put(16, 7, 6, 0);
     packed.put(17, 5, 6, 31).put(18, 3, 6, searchesOtherFrequencies ? 4 : 32);
     packed.put(19, 1, 1, searchesOtherFrequencies ? 1 : 0).put(19, 2, 4, 2);
@@ -109,7 +109,7 @@ ByteBuffer idleNeighboursRecord(unsigned earfcn, const std::vector<LteCell>& cel
         entry.put(1, 1, 8, rawRssi(cell));
         entry.put(2, 1, 9, rawRsrp(cell) / 2).put(4, 0, 9, rawRsrp(cell) / 2 - 1); // half dB steps
         entry.put(5, 1, 7, rawRsrq(cell)).put(6, 0, 7, rawRsrq(cell));
-        entry.put(6, 7, 7, levelMargin_db(cell, kRequired_dbm) + kSrxlevOffset_db);
+        entry.put(6, 7, 7, levelMargin_db(cell, kRequiredDbm) + kSrxlevOffsetDb);
         entry.put(8, 0, 16, 20 + static_cast<int>(cell.physicalCellId % 7));
         entry.put(12, 0, 11, static_cast<int>(cell.physicalCellId * 3));
         entry.put(13, 3, 19, static_cast<int>(cell.physicalCellId * 1021));

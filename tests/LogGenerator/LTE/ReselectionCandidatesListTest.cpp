@@ -134,8 +134,7 @@ TEST(ReselectionCandidatesList, AnEntryIsWholeWhenTheBytesReadForItsTechnologyLi
 }
 
 TEST(ReselectionCandidatesList, TheListStopsAtTheFirstEntryThatIsNotWhole) {
-    // An LTE entry whose data ends the record would be whole 4 bytes earlier; the CDMA entry
-    // before it is not, and so nothing behind it is shown.
+    // The third entry is whole, but the CDMA entry before it is not, and so neither is shown.
     RecordFixture<ReselectionCandidatesList> fixture;
     fixture.feed(head(3).u16(1).u16(9).u16(2).u16(3).u16(4).u16(9));
     EXPECT_EQ(fixture.list(),
