@@ -10,14 +10,10 @@ namespace {
 /// The sections of resources/UTRAN.plist.
 PropertyList displayTemplate() {
     return Dictionary{
-        {"RRC Info", Dictionary()},
-        {"Serving Cell Info", Dictionary()},
-        {"Neighbor Cell List", Array()},
-        {"GSM Neighbor Cell List", Array()},
-        {"TRCH BLER", Array()},
-        {"CCTRCH SIR", Array()},
-        {"PDP Context Info", Array()},
-        {"SIM Info", Dictionary()},
+        {"RRC Info", Dictionary()},      {"Serving Cell Info", Dictionary()},
+        {"Neighbor Cell List", Array()}, {"GSM Neighbor Cell List", Array()},
+        {"TRCH BLER", Array()},          {"CCTRCH SIR", Array()},
+        {"PDP Context Info", Array()},   {"SIM Info", Dictionary()},
     };
 }
 
