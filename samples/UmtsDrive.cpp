@@ -170,6 +170,9 @@ void addUmtsSecond(Drive& drive, int second, unsigned servingBefore) {
     if (second > 0 && inSession(second) != inSession(second - 1)) {
         addConnection(drive, start + 30, inSession(second));
     }
+    if (second == kToUmts) {
+        drive.add(start + 40, plainRecord(0x512C, {0, 0, 0, 1}, 17)); // GSM rests
+    }
     drive.add(start + 100, searcherRecord(cells));
     drive.add(start + 600, searcherRecord(cells));
     if (inSession(second)) {

@@ -103,8 +103,8 @@ TEST(ZOR_GSMLogGenerator, SectionsWithoutACodeExistFromTheStartAndNeverChange) {
     expectSilentSectionsEmpty(state);
 }
 
-/// The lines of a packet to a generator whose display stands.
-Lines linesOf(const Record& record) {
+/// What the records log of a packet to a generator whose display stands.
+Lines recordLinesOf(const Record& record) {
     GeneratorFixture fixture;
     fixture.resources.add("ZOR_GSM",
                           doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"));
@@ -113,19 +113,25 @@ Lines linesOf(const Record& record) {
     generator->updateState(state, Record(0x1234).bytes());
     RecordingLog log;
     generator->updateState(state, record.bytes());
-    return log.take();
+    Lines lines = log.take();
+    const std::string framing[] = {"Log Header 0x1", "Returning buffer without modifications <"};
+    for (const std::string& line : framing) {
+        EXPECT_EQ(lines.at(0).text.substr(0, line.size()), line);
+        lines.erase(lines.begin());
+    }
+    return lines;
 }
 
 TEST(ZOR_GSMLogGenerator, ARegistrationPacketReachesItsFourRecordsInOrder) {
-    EXPECT_EQ(linesOf(Record(0x7132).padTo(16)),
+    EXPECT_EQ(recordLinesOf(Record(0x7132).padTo(16)),
               (Lines{{4, "ProcessPS"}, {4, "ProcessCS"}, {4, "Serving PLMN"}, {4, "ProcessCS"}}));
 }
 
 TEST(ZOR_GSMLogGenerator, AMeasurementPacketReachesItsFourRecordsInOrder) {
-    EXPECT_EQ(linesOf(Record(0x5137).padTo(29)), (Lines{{4, "GPRSInformation"},
-                                                        {4, "GSMServingCell"},
-                                                        {4, "NeighboringCells"},
-                                                        {4, "GSMRRInfo"}}));
+    EXPECT_EQ(recordLinesOf(Record(0x5137).padTo(29)), (Lines{{4, "GPRSInformation"},
+                                                              {4, "GSMServingCell"},
+                                                              {4, "NeighboringCells"},
+                                                              {4, "GSMRRInfo"}}));
 }
 
 TEST(Technologies, TheGSMIdentifierGivesTheGSMGenerator) {
