@@ -33,14 +33,16 @@ int hillLoss_db(int second) {
 }
 
 /// What the searcher shows at least of a level, and of its part of the carrier.
-constexpr int kLeast_dbm = -118;
-constexpr int kLeast_db = -20;
+constexpr int kLeastLevelDbm = -118;
+constexpr int kLeastEcnoDb = -20;
 
 /// The UMTS cells around, the strongest first, which serves: it changes whenever the car has come
 /// nearer to the other one. A third cell comes into sight for a while.
 std::vector<UmtsCell> umtsCells(int second) {
     const int loss_db = hillLoss_db(second);
-    const auto level_dbm = [loss_db](int level) { return std::max(level - loss_db, kLeast_dbm); };
+    const auto level_dbm = [loss_db](int level) {
+        return std::max(level - loss_db, kLeastLevelDbm);
+    };
     std::vector<UmtsCell> cells = {{212, kUarfcn, level_dbm(wave(second, 40, -104, -78)), 0},
                                    {388, kUarfcn, level_dbm(wave(second + 20, 40, -106, -82)), 0}};
     if (second % 30 >= 12) {
@@ -51,7 +53,7 @@ std::vector<UmtsCell> umtsCells(int second) {
     // All cells share one carrier: what is weaker than the strongest has that much less of it.
     const int best_db = wave(second, 20, -9, -5) - loss_db / 4;
     for (UmtsCell& cell : cells) {
-        cell.ecno_db = std::max(best_db + cell.rscp_dbm - cells.front().rscp_dbm, kLeast_db);
+        cell.ecno_db = std::max(best_db + cell.rscp_dbm - cells.front().rscp_dbm, kLeastEcnoDb);
     }
     return cells;
 }
