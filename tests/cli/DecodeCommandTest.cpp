@@ -229,6 +229,7 @@ TEST_F(DecodeCommandTest, CsvGivesARowForEachChangeFromTickToTick) {
 
 TEST_F(DecodeCommandTest, CsvAtTheEndGivesTheFinalValuesWithTheTimeOfTheLastPacket) {
     options.format = DecodeFormat::Csv;
+    options.every = Every::End;
     add("a.pcap", {{milliseconds(0), "A=1"}, {milliseconds(2500), "A=2"}});
     add("b.pcap", {{milliseconds(0), "A=2"}});
     EXPECT_EQ(run(), kExitSuccess);

@@ -54,10 +54,13 @@ TEST(Options, DecodeWritesTheLastDisplayAsJsonUnlessToldOtherwise) {
     const auto plain = parsed<DecodeOptions>({"decode", "a.pcap", "b.pcap"});
     EXPECT_EQ(plain.recordings, (std::vector<std::string>{"a.pcap", "b.pcap"}));
     EXPECT_EQ(plain.technology, nullptr);
-    EXPECT_EQ(plain.every, Every::End);
+    EXPECT_EQ(plain.chosenEvery(), Every::End);
     EXPECT_EQ(plain.format, DecodeFormat::Json);
     EXPECT_EQ(plain.systemLog, std::nullopt);
     EXPECT_FALSE(plain.strict);
+
+    const auto csv = parsed<DecodeOptions>({"decode", "--format", "csv", "a.pcap"});
+    EXPECT_EQ(csv.chosenEvery(), Every::Tick) << "CSV tells what changes";
 
     const auto told =
         parsed<DecodeOptions>({"decode", "--technology", "lte", "--every", "tick", "--format",
@@ -137,6 +140,16 @@ TEST(Options, WhatNobodyKnowsIsNamed) {
               std::string::npos);
     for (const char* speed : {"-1", "nan", "inf", "fast", "1x", ""}) {
         EXPECT_NE(wrongUsage({"--speed", speed, "a"}).find("--speed"), std::string::npos);
+    }
+}
+
+TEST(Options, StandardInputCannotBeLooped) {
+    for (const std::vector<std::string>& arguments :
+         {std::vector<std::string>{"-", "--loop"}, {"service", "--play", "-", "--loop"}}) {
+        const ParseEnd end = std::get<ParseEnd>(parseOptions(arguments));
+        EXPECT_EQ(end.status, kExitWrongUsage);
+        EXPECT_EQ(end.text, "pallax: standard input can be played only once, not with --loop "
+                            "(pallax --help tells more)\n");
     }
 }
 

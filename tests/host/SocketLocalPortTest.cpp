@@ -279,9 +279,11 @@ public:
         queue->async([this] { lines.emplace_back("posted by a tick"); });
         return true;
     }
+    void packetNumber(std::uint32_t number) override { numbers.push_back(number); }
     void sourceEnded() override { lines.emplace_back("ended"); }
 
     std::vector<std::string> lines;
+    std::vector<std::uint32_t> numbers;
     int steps = 0;
     MainQueue* queue = nullptr;
 };
@@ -298,8 +300,10 @@ TEST_F(SocketLocalPortTest, SourceTimesAreToldBeforeTheMessageAndTicksPrecedeIt)
     ByteBuffer stream;
     FrameHeader header;
     header.sourceTime = Time(std::chrono::nanoseconds(5));
+    header.number = 17;
     appendFrame(stream, header, bytesOf("a"));
     header.sourceTime.reset();
+    header.number = 0;
     appendFrame(stream, header, bytesOf("b"));
     header.kind = FrameKind::Clock;
     header.sourceTime = Time(std::chrono::nanoseconds(9));
@@ -315,6 +319,7 @@ TEST_F(SocketLocalPortTest, SourceTimesAreToldBeforeTheMessageAndTicksPrecedeIt)
     EXPECT_EQ(diary.lines,
               (std::vector<std::string>{"began", "advance 5", "posted by a tick", "advance 5",
                                         "message a", "message b", "advance 9", "ended"}));
+    EXPECT_EQ(diary.numbers, (std::vector<std::uint32_t>{17, 0}));
 }
 
 } // namespace

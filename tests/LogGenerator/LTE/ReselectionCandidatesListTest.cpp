@@ -197,14 +197,15 @@ TEST(ReselectionCandidatesList, AnyBytesKeepItsEntriesWithinItsKeys) {
                                         "Pilot"};
     anyBytesKeepWithin<ReselectionCandidatesList>(keys);
     // Of any bytes, few are a technology: the same with technologies that are mostly known.
-    anyRecordsKeepWithin<ReselectionCandidatesList, NothingThrown>(keys, [](LogCode) {
-        Record record = head(*rc::gen::inRange(0U, 12U));
-        for (const unsigned word :
-             *rc::gen::container<std::vector<unsigned>>(rc::gen::inRange(0U, 7U))) {
-            record.u16(word);
-        }
-        return record.bytes();
-    });
+    anyRecordsKeepWithin<ReselectionCandidatesList, NothingThrown>(
+        keys, codesOf<ReselectionCandidatesList>(), [](LogCode) {
+            Record record = head(*rc::gen::inRange(0U, 12U));
+            for (const unsigned word :
+                 *rc::gen::container<std::vector<unsigned>>(rc::gen::inRange(0U, 7U))) {
+                record.u16(word);
+            }
+            return record.bytes();
+        });
 }
 
 } // namespace

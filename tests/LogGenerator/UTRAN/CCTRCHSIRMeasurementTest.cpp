@@ -115,7 +115,8 @@ TEST(CCTRCHSIRMeasurement, AnyBytesKeepItsEntriesWithinItsKeys) {
     const std::set<std::string> keys = {"CCTRCH ID", "TSNUM", "SIR"};
     anyBytesKeepWithin<CCTRCHSIRMeasurement>(keys);
     // Behind the fixed distance to the first entry.
-    anyRecordsKeepWithin<CCTRCHSIRMeasurement, NothingThrown>(keys, [](LogCode) {
+    anyRecordsKeepWithin<CCTRCHSIRMeasurement,
+                         NothingThrown>(keys, codesOf<CCTRCHSIRMeasurement>(), [](LogCode) {
         const auto transport = *rc::gen::inRange(0U, 64U);
         return channels(transport, *rc::gen::inRange(0U, 16U)).append(*anyRecordBytes()).bytes();
     });

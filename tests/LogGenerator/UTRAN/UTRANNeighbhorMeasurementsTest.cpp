@@ -147,13 +147,14 @@ TEST(UTRANNeighbhorMeasurements, AnyBytesKeepItsEntriesWithinItsKeys) {
     const std::set<std::string> keys = {"UARFCN", "Cell ID", "Filter RSCP", "Status", "inJDCS"};
     anyBytesKeepWithin<UTRANNeighbhorMeasurements>(keys);
     // Behind the fixed distance to the first entry.
-    anyRecordsKeepWithin<UTRANNeighbhorMeasurements, NothingThrown>(keys, [](LogCode code) {
-        return Record(code)
-            .append(*anyRecordBytes())
-            .padTo(kEntries)
-            .append(*anyRecordBytes())
-            .bytes();
-    });
+    anyRecordsKeepWithin<UTRANNeighbhorMeasurements, NothingThrown>(
+        keys, codesOf<UTRANNeighbhorMeasurements>(), [](LogCode code) {
+            return Record(code)
+                .append(*anyRecordBytes())
+                .padTo(kEntries)
+                .append(*anyRecordBytes())
+                .bytes();
+        });
 }
 
 } // namespace
