@@ -46,7 +46,8 @@ TEST(LTELogGenerator, TheStartCommandHoldsExactlyTheCodesOfItsRecords) {
     GeneratorFixture fixture;
     const auto generator = LTELogGenerator::generator(fixture.environment());
     Array codes;
-    for (const LogCode logCode : {0xB0C1U, 0xB0C2U, 0xB179U, 0xB17FU, 0xB180U, 0xB186U}) {
+    for (const LogCode logCode :
+         std::vector<LogCode>{0xB0C1U, 0xB0C2U, 0xB179U, 0xB17FU, 0xB180U, 0xB186U}) {
         codes.push_back(PropertyList::integer(logCode));
     }
     const Array extraCodes = {PropertyList::integer(0), PropertyList::integer(1),

@@ -104,7 +104,7 @@ TEST(UTRANLogGenerator, TheStartCommandHoldsExactlyTheCodesOfItsRecords) {
     fixture.resources.add("UTRAN", Dictionary());
     const auto generator = UTRANLogGenerator::generator(fixture.environment());
     Array codes;
-    for (const LogCode logCode : {0xD00A, 0xD00C, 0xD00E, 0xD0E0, 0xD0E2}) {
+    for (const LogCode logCode : std::vector<LogCode>{0xD00A, 0xD00C, 0xD00E, 0xD0E0, 0xD0E2}) {
         codes.push_back(PropertyList::integer(logCode));
     }
     const Array extraCodes = {PropertyList::integer(0), PropertyList::integer(1),

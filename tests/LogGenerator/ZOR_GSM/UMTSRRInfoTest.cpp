@@ -155,7 +155,7 @@ TEST(UMTSRRInfo, LogsItsLineOnEveryCall) {
         fixture.feed(record);
         EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"}}));
     }
-    for (const LogCode code : {0x4125U, 0x4127U, 0x4157U, 0x4031U}) {
+    for (const LogCode code : std::vector<LogCode>{0x4125U, 0x4127U, 0x4157U, 0x4031U}) {
         fixture.feed(Record(code));
         EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"}}))
             << "a short packet is dropped silently";
