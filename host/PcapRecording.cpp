@@ -92,9 +92,7 @@ Result<std::FILE*, RecordingError> openFile(const std::string& path, const std::
     std::FILE* file = path == "-" ? stdin : std::fopen(path.c_str(), "rbe");
     struct stat status {};
     std::string_view reason;
-    if (file == nullptr) {
-        reason = std::strerror(errno);
-    } else if (::fstat(::fileno(file), &status) != 0) {
+    if (file == nullptr || ::fstat(::fileno(file), &status) != 0) {
         reason = std::strerror(errno);
     } else if (S_ISDIR(status.st_mode)) {
         reason = "it is a folder";
