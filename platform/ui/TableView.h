@@ -1,0 +1,91 @@
+#pragma once
+
+#include "platform/ui/Geometry.h"
+#include "platform/ui/Views.h"
+
+#include <cstddef>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace pallax::ui {
+
+enum class CellStyle {
+    Plain = 0,
+    /// A title on the left and a detail on the right.
+    TitleAndDetail = 1,
+};
+
+enum class CellAccessory { None, DisclosureIndicator, Checkmark };
+
+/// A row as it is shown. A class of its own may add labels and lay them out.
+class TableCell {
+public:
+    TableCell(CellStyle style, std::string reuseIdentifier)
+        : _style(style), _reuseIdentifier(std::move(reuseIdentifier)) {}
+    virtual ~TableCell() = default;
+    TableCell(const TableCell&) = delete;
+    TableCell& operator=(const TableCell&) = delete;
+
+    CellStyle style() const { return _style; }
+    const std::string& reuseIdentifier() const { return _reuseIdentifier; }
+
+    CellAccessory accessory() const { return _accessory; }
+    void setAccessory(CellAccessory accessory) { _accessory = accessory; }
+
+    /// The cell's own label, shown by plain cells.
+    Label& textLabel() { return _textLabel; }
+    const Label& textLabel() const { return _textLabel; }
+
+    /// The content area, as the front end gives it.
+    const Rect& contentBounds() const { return _contentBounds; }
+    void setContentBounds(const Rect& bounds) { _contentBounds = bounds; }
+
+    /// The toolkit's own layout: its label fills the content area.
+    virtual void layoutSubviews() { _textLabel.frame = _contentBounds; }
+
+private:
+    CellStyle _style;
+    std::string _reuseIdentifier;
+    CellAccessory _accessory = CellAccessory::None;
+    Label _textLabel;
+    Rect _contentBounds;
+};
+
+/// A row in words, for what a front end does beyond drawing it: searching, comparing, copying,
+/// reading aloud.
+struct RowText {
+    std::string name;
+    std::optional<std::string> value;    ///< of a leaf
+    std::optional<std::size_t> elements; ///< of a branch that is a list: how many
+    bool isBranch = false;
+    /// A leaf whose value is not what it was before the table was last reloaded with new data.
+    bool hasChanged = false;
+};
+
+/// What a table shows: one section of rows. The table asks only for the rows it needs.
+class TableSource {
+public:
+    virtual ~TableSource() = default;
+    virtual std::size_t numberOfRows() const = 0;
+    /// `row` is below numberOfRows().
+    virtual std::shared_ptr<TableCell> cellForRow(std::size_t row) = 0;
+    virtual RowText textOfRow(std::size_t row) const = 0;
+    virtual void didSelectRow(std::optional<std::size_t> row) = 0;
+};
+
+/// A table on the screen. Its source outlives it.
+class TableView {
+public:
+    virtual ~TableView() = default;
+    /// A cell with this identifier that has left the screen, or null.
+    virtual std::shared_ptr<TableCell> dequeueReusableCell(std::string_view identifier) = 0;
+    /// The content area a new cell gets.
+    virtual Rect contentBounds() const = 0;
+    virtual void reloadData() = 0;
+    virtual void deselectRow(std::size_t row, bool animated) = 0;
+    virtual void sizeToFit() = 0;
+};
+
+} // namespace pallax::ui
