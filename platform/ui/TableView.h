@@ -8,6 +8,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace pallax::ui {
 
@@ -18,6 +19,13 @@ enum class CellStyle {
 };
 
 enum class CellAccessory { None, DisclosureIndicator, Checkmark };
+
+/// What a cell has to draw in its content area. The labels' frames count from the content area,
+/// or, where there is a scroll container, from the start of its content.
+struct CellContents {
+    std::vector<const Label*> labels;
+    const ScrollContainer* container = nullptr;
+};
 
 /// A row as it is shown. A class of its own may add labels and lay them out.
 class TableCell {
@@ -41,6 +49,9 @@ public:
     /// The content area, as the front end gives it.
     const Rect& contentBounds() const { return _contentBounds; }
     void setContentBounds(const Rect& bounds) { _contentBounds = bounds; }
+
+    /// Valid as long as the cell.
+    virtual CellContents contents() const { return {{&_textLabel}, nullptr}; }
 
     /// The toolkit's own layout: its label fills the content area.
     virtual void layoutSubviews() { _textLabel.frame = _contentBounds; }

@@ -1,0 +1,83 @@
+#include "ui/terminal/CursesKeys.h"
+
+#include "ui/terminal/Curses.h"
+
+#include <algorithm>
+#include <array>
+
+namespace pallax::terminal {
+
+namespace {
+
+struct Code {
+    unsigned code;
+    Key key;
+};
+
+constexpr auto kCodes = std::to_array<Code>({
+    {KEY_UP, Key::Up},
+    {KEY_DOWN, Key::Down},
+    {KEY_LEFT, Key::Left},
+    {KEY_RIGHT, Key::Right},
+    {KEY_PPAGE, Key::PageUp},
+    {KEY_NPAGE, Key::PageDown},
+    {KEY_HOME, Key::Home},
+    {KEY_END, Key::End},
+    {KEY_ENTER, Key::Enter},
+    {KEY_BACKSPACE, Key::Backspace},
+    {KEY_DC, Key::Delete},
+    {KEY_BTAB, Key::BackTab},
+});
+
+std::optional<KeyEvent> mouseEvent() {
+    MEVENT event{};
+    if (::getmouse(&event) != OK) {
+        return std::nullopt;
+    }
+    KeyEvent key{.character = 0, .x = event.x, .y = event.y};
+    if ((event.bstate & BUTTON4_PRESSED) != 0) {
+        key.key = Key::WheelUp;
+    } else if ((event.bstate & BUTTON5_PRESSED) != 0) {
+        key.key = Key::WheelDown;
+    } else if ((event.bstate & BUTTON1_PRESSED) != 0) {
+        key.key = Key::Click;
+    } else {
+        return std::nullopt;
+    }
+    return key;
+}
+
+} // namespace
+
+std::optional<KeyEvent> keyOfCode(unsigned code) {
+    if (code == KEY_MOUSE) {
+        return mouseEvent();
+    }
+    const auto* found = std::find_if(kCodes.begin(), kCodes.end(),
+                                     [code](const Code& known) { return known.code == code; });
+    if (found == kCodes.end()) {
+        return std::nullopt;
+    }
+    return KeyEvent{.key = found->key};
+}
+
+KeyEvent keyOfCharacter(char32_t character) {
+    constexpr char32_t kEscape = 0x1B;
+    constexpr char32_t kDelete = 0x7F; // what most terminals send for the backspace key
+    switch (character) {
+    case U'\r':
+    case U'\n':
+        return {.key = Key::Enter};
+    case U'\t':
+        return {.key = Key::Tab};
+    case U'\b':
+    case kDelete:
+        return {.key = Key::Backspace};
+    case kEscape:
+        return {.key = Key::Escape};
+    default:
+        return {.key = Key::Character, .character = character};
+    }
+}
+
+} // namespace pallax::terminal

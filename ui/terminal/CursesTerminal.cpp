@@ -1,0 +1,219 @@
+#include "ui/terminal/CursesTerminal.h"
+
+#include "platform/Base64.h"
+#include "platform/Utf8.h"
+#include "ui/terminal/Curses.h"
+#include "ui/terminal/CursesCapability.h"
+#include "ui/terminal/CursesKeys.h"
+#include "ui/terminal/TerminalRestorer.h"
+
+#include <array>
+#include <clocale>
+#include <cstdio>
+#include <cstdlib>
+#include <langinfo.h>
+#include <poll.h>
+#include <sys/ioctl.h>
+#include <unistd.h>
+#include <utility>
+
+namespace pallax::terminal {
+
+namespace {
+
+constexpr short kAccentPair = 1;
+
+struct FileCloser {
+    void operator()(std::FILE* file) const { (void)std::fclose(file); }
+};
+using OwnedFile = std::unique_ptr<std::FILE, FileCloser>;
+
+/// What leaves the screen as it was: attributes off, cursor seen, keypad and mouse off, the other
+/// screen back.
+std::string restoringSequence() {
+    constexpr std::string_view kMouseOff = "\x1b[?1000l\x1b[?1002l\x1b[?1003l\x1b[?1006l";
+    std::string sequence =
+        terminalCapability("sgr0") + terminalCapability("cnorm") + terminalCapability("rmkx");
+    if (!terminalCapability("kmous").empty()) {
+        sequence += kMouseOff;
+    }
+    return sequence + terminalCapability("rmcup") + "\r\n";
+}
+
+bool isUtf8Locale() {
+    return std::string_view(::nl_langinfo(CODESET)) == "UTF-8";
+}
+
+bool wantsColor(ColorUse use) {
+    const char* refusal = std::getenv("NO_COLOR");
+    return use == ColorUse::Always ||
+           (use == ColorUse::Auto && (refusal == nullptr || *refusal == '\0'));
+}
+
+/// A cell's text as the library takes it: a character and a few combining ones.
+std::array<wchar_t, CCHARW_MAX + 1> wideText(std::string_view text, bool asciiOnly) {
+    std::array<wchar_t, CCHARW_MAX + 1> wide{};
+    std::size_t count = 0;
+    for (std::size_t at = 0; at < text.size() && count < CCHARW_MAX;) {
+        const Utf8CodePoint codePoint = utf8At(text, at);
+        const bool isForeign = asciiOnly && codePoint.value > 0x7F;
+        wide.at(count++) = isForeign ? L'?' : static_cast<wchar_t>(codePoint.value);
+        at += codePoint.size;
+        if (asciiOnly) {
+            break;
+        }
+    }
+    return wide;
+}
+
+} // namespace
+
+struct CursesTerminal::Impl {
+    OwnedFile input; // null where it is standard input
+    SCREEN* screen = nullptr;
+    bool hasAccentColor = false;
+    bool isUtf8 = false;
+    std::unique_ptr<TerminalRestorer> restorer;
+
+    attr_t attributesOf(Style style) const {
+        attr_t attributes = A_NORMAL;
+        attributes |= style.bold ? A_BOLD : A_NORMAL;
+        attributes |= style.dim ? A_DIM : A_NORMAL;
+        attributes |= style.underline ? A_UNDERLINE : A_NORMAL;
+        attributes |= style.accent && !hasAccentColor ? A_REVERSE : A_NORMAL;
+        return attributes;
+    }
+
+    void showCell(const Grid::Cell& cell, int x, int y) const {
+        const auto text = wideText(cell.text, !isUtf8);
+        const short pair = cell.style.accent && hasAccentColor ? kAccentPair : 0;
+        cchar_t character{};
+        ::setcchar(&character, text.data(), attributesOf(cell.style), pair, nullptr);
+        ::mvadd_wch(y, x, &character);
+    }
+};
+
+bool CursesTerminal::isPossible() {
+    const char* type = std::getenv("TERM");
+    return ::isatty(STDOUT_FILENO) != 0 && type != nullptr && *type != '\0' &&
+           std::string_view(type) != "dumb";
+}
+
+Result<std::unique_ptr<CursesTerminal>, TerminalError>
+CursesTerminal::open(const Options& options) {
+    (void)std::setlocale(LC_CTYPE, ""); // numbers stay as the C locale writes them
+    auto impl = std::make_unique<Impl>();
+    impl->isUtf8 = isUtf8Locale();
+    if (::isatty(STDIN_FILENO) == 0) {
+        impl->input.reset(std::fopen("/dev/tty", "re"));
+        if (!impl->input) {
+            return TerminalError{"There is no terminal to take keys from; --print does without."};
+        }
+    }
+    impl->restorer = std::make_unique<TerminalRestorer>(STDOUT_FILENO);
+    std::FILE* input = impl->input ? impl->input.get() : stdin;
+    impl->screen = ::newterm(nullptr, stdout, input);
+    if (impl->screen == nullptr) {
+        const char* type = std::getenv("TERM");
+        return TerminalError{"Nothing is known here of the terminal type \"" +
+                             std::string(type == nullptr ? "" : type) +
+                             "\" (TERM); --print does without."};
+    }
+    impl->restorer->setSequence(restoringSequence());
+    ::cbreak();
+    ::noecho();
+    ::nonl();
+    ::nodelay(::stdscr, TRUE);
+    ::keypad(::stdscr, TRUE);
+    constexpr int kEscapeDelay = 25; // milliseconds in which an escape sequence is complete
+    ::set_escdelay(kEscapeDelay);
+    if (wantsColor(options.color) && ::has_colors() && ::start_color() == OK) {
+        ::use_default_colors();
+        impl->hasAccentColor = ::init_pair(kAccentPair, COLOR_CYAN, -1) == OK;
+    }
+    if (options.mouse) {
+        ::mousemask(BUTTON1_PRESSED | BUTTON4_PRESSED | BUTTON5_PRESSED, nullptr);
+        ::mouseinterval(0); // a press counts at once
+    }
+    return std::unique_ptr<CursesTerminal>(new CursesTerminal(std::move(impl)));
+}
+
+CursesTerminal::CursesTerminal(std::unique_ptr<Impl> impl) : _impl(std::move(impl)) {}
+
+CursesTerminal::~CursesTerminal() {
+    ::endwin();
+    ::delscreen(_impl->screen);
+}
+
+int CursesTerminal::columns() const {
+    return ::getmaxx(::stdscr);
+}
+
+int CursesTerminal::rows() const {
+    return ::getmaxy(::stdscr);
+}
+
+const Marks& CursesTerminal::marks() const {
+    return _impl->isUtf8 ? kUtf8Marks : kAsciiMarks;
+}
+
+int CursesTerminal::inputDescriptor() const {
+    return _impl->input ? ::fileno(_impl->input.get()) : STDIN_FILENO;
+}
+
+void CursesTerminal::adoptSize() {
+    winsize size{};
+    if (::ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) == 0 && size.ws_row > 0 && size.ws_col > 0) {
+        ::resizeterm(size.ws_row, size.ws_col);
+    }
+}
+
+void CursesTerminal::show(const Grid& grid) {
+    ::erase();
+    for (int y = 0; y < grid.rows(); ++y) {
+        for (int x = 0; x < grid.columns(); ++x) {
+            if (!grid.at(x, y).text.empty()) {
+                _impl->showCell(grid.at(x, y), x, y);
+            }
+        }
+    }
+    ::curs_set(grid.cursor() ? 1 : 0);
+    if (grid.cursor()) {
+        ::move(grid.cursor()->y, grid.cursor()->x);
+    }
+    ::refresh();
+}
+
+void CursesTerminal::repaint() {
+    ::clearok(::stdscr, TRUE);
+}
+
+std::optional<KeyEvent> CursesTerminal::read() {
+    wint_t code = 0;
+    for (;;) {
+        const int kind = ::get_wch(&code);
+        if (kind == ERR) {
+            return std::nullopt;
+        }
+        if (kind != KEY_CODE_YES) {
+            return keyOfCharacter(code);
+        }
+        if (const auto key = keyOfCode(code)) {
+            return key;
+        }
+    }
+}
+
+bool CursesTerminal::isHungUp() const {
+    pollfd input{inputDescriptor(), POLLIN, 0};
+    return ::poll(&input, 1, 0) > 0 && (input.revents & (POLLHUP | POLLERR | POLLNVAL)) != 0;
+}
+
+void CursesTerminal::copy(std::string_view text) {
+    const ByteBuffer bytes(text.begin(), text.end());
+    const std::string sequence = "\x1b]52;c;" + base64Text(bytes) + "\a";
+    (void)std::fwrite(sequence.data(), 1, sequence.size(), stdout);
+    (void)std::fflush(stdout);
+}
+
+} // namespace pallax::terminal

@@ -1,0 +1,317 @@
+#include "ui/terminal/FrontEnd.h"
+
+#include "ui/terminal/Overlays.h"
+#include "ui/terminal/PaneView.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace pallax::terminal {
+
+FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
+    : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }) {}
+
+/// What a click would do may be gone by now, until the next drawing tells.
+void FrontEnd::needsDisplay() {
+    _hits.clear();
+    _surroundings.needsDisplay();
+}
+
+TerminalTable* FrontEnd::table() const {
+    TerminalNavigation* navigation = _toolkit.navigation();
+    return navigation == nullptr ? nullptr : &terminalTable(navigation->top().table());
+}
+
+Grid FrontEnd::draw() {
+    Grid grid(_toolkit.columns(), _toolkit.rows());
+    _hits.clear();
+    TerminalNavigation* navigation = _toolkit.navigation();
+    if (navigation == nullptr) {
+        return grid;
+    }
+    if (grid.columns() < kLeastColumns || grid.rows() < kLeastRows) {
+        drawTooSmall(grid);
+        return grid;
+    }
+    const LineEditor* editor = _filterEditor ? &*_filterEditor : nullptr;
+    PaneView(grid, _marks, _hits).draw(*navigation, {_spinnerTurn, editor, _message});
+    if (const auto& modal = navigation->modal()) {
+        ModalView(grid, _marks, _hits).draw(*modal, _modalFocus);
+    }
+    if (_isHelpShown) {
+        _helpRows = drawHelp(grid, _marks, _helpFirst);
+    }
+    if (const ui::Alert* alert = _toolkit.alert()) {
+        drawAlert(grid, _marks, *alert);
+    }
+    return grid;
+}
+
+bool FrontEnd::isAnimated() const {
+    const TerminalNavigation* navigation = _toolkit.navigation();
+    return navigation != nullptr && isLoading(navigation->top().toolbarItems());
+}
+
+void FrontEnd::turn() {
+    ++_spinnerTurn;
+    needsDisplay();
+}
+
+void FrontEnd::handle(const KeyEvent& event) {
+    TerminalNavigation* navigation = _toolkit.navigation();
+    if (navigation == nullptr) {
+        return;
+    }
+    if (event.key == Key::Character && event.character == controlKey('l')) {
+        _surroundings.repaint();
+        return;
+    }
+    _message.reset();
+    // A copy, for the screen may be closed by what it does.
+    const std::shared_ptr<ui::ModalScreen> modal = navigation->modal();
+    if (_toolkit.alert() != nullptr) {
+        handleAlert(event);
+    } else if (_isHelpShown) {
+        handleHelp(event);
+    } else if (event.key == Key::Click || event.key == Key::WheelUp ||
+               event.key == Key::WheelDown) {
+        handleMouse(event);
+    } else if (modal) {
+        handleModal(*modal, event);
+    } else if (_filterEditor) {
+        handleFilter(*table(), event);
+    } else {
+        handlePane(event);
+    }
+}
+
+void FrontEnd::handleMouse(const KeyEvent& event) {
+    constexpr std::ptrdiff_t kWheelRows = 3;
+    if (event.key != Key::Click) {
+        if (!_toolkit.navigation()->modal()) {
+            table()->moveCursor(event.key == Key::WheelUp ? -kWheelRows : kWheelRows);
+        }
+        return;
+    }
+    // A copy, for the action may change what is on the screen.
+    if (const HitMap::Action action = _hits.at(event.x, event.y)) {
+        action();
+    }
+}
+
+void FrontEnd::handleAlert(const KeyEvent& event) {
+    const bool closes =
+        event.key == Key::Enter || event.key == Key::Escape || event.key == Key::Click ||
+        (event.key == Key::Character && (event.character == U' ' || event.character == U'q'));
+    if (closes) {
+        _toolkit.closeAlert();
+    }
+}
+
+/// The arrows scroll where the page does not fit; any other key closes it.
+void FrontEnd::handleHelp(const KeyEvent& event) {
+    const int last = std::max(static_cast<int>(helpLines().size()) - _helpRows, 0);
+    if (event.key == Key::Down && _helpFirst < last) {
+        ++_helpFirst;
+    } else if (event.key == Key::Up && _helpFirst > 0) {
+        --_helpFirst;
+    } else if (event.key != Key::Down && event.key != Key::Up) {
+        _isHelpShown = false;
+    }
+    needsDisplay();
+}
+
+void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
+    TerminalTextField& field = terminalTextField(screen.field());
+    if (event.key == Key::Escape) {
+        screen.cancelPressed();
+        return;
+    }
+    if (event.key == Key::PageUp || event.key == Key::PageDown) {
+        TerminalTable& list = terminalTable(screen.list());
+        list.moveCursor(event.key == Key::PageUp ? -list.page() : list.page());
+        return;
+    }
+    const bool forwards = event.key == Key::Tab || event.key == Key::Down;
+    const bool backwards = event.key == Key::BackTab || event.key == Key::Up;
+    if (field.isEditing()) {
+        if (forwards || backwards) {
+            _modalFocus = forwards ? ModalFocus::Save : ModalFocus::Cancel;
+            field.resignFirstResponder();
+        } else if (field.handle(event) && !field.isEditing()) {
+            _modalFocus = ModalFocus::Save; // behind the return key
+        }
+        return;
+    }
+    if (event.key == Key::Enter || (event.key == Key::Character && event.character == U' ')) {
+        _modalFocus == ModalFocus::Save ? screen.savePressed() : screen.cancelPressed();
+        return;
+    }
+    const bool isSave = _modalFocus == ModalFocus::Save;
+    if ((forwards && !isSave) || (backwards && isSave)) {
+        field.beginEditing();
+    } else if (forwards || backwards || event.key == Key::Left || event.key == Key::Right) {
+        _modalFocus = isSave ? ModalFocus::Cancel : ModalFocus::Save;
+        needsDisplay();
+    }
+}
+
+void FrontEnd::handleFilter(TerminalTable& table, const KeyEvent& event) {
+    const bool erasesNothing = event.key == Key::Backspace && _filterEditor->text().empty();
+    if (event.key == Key::Escape || erasesNothing) {
+        _filterEditor.reset();
+        table.setFilter("");
+    } else if (event.key == Key::Enter) {
+        _filterEditor.reset();
+        needsDisplay();
+    } else if (event.key == Key::Up || event.key == Key::Down || event.key == Key::PageUp ||
+               event.key == Key::PageDown) {
+        (void)moveCursor(table, event);
+    } else if (_filterEditor->handle(event)) {
+        table.setFilter(_filterEditor->text());
+    }
+}
+
+void FrontEnd::handlePane(const KeyEvent& event) {
+    TerminalTable& pane = *table();
+    if (moveCursor(pane, event)) {
+        return;
+    }
+    switch (event.key) {
+    case Key::Enter:
+        openOrScroll(pane, false);
+        return;
+    case Key::Right:
+        openOrScroll(pane, true);
+        return;
+    case Key::Left:
+        goBack(pane);
+        return;
+    case Key::Backspace:
+        _toolkit.navigation()->back();
+        return;
+    case Key::Escape:
+        escape(pane);
+        return;
+    case Key::Character:
+        handlePaneCharacter(event.character);
+        return;
+    default:
+        return;
+    }
+}
+
+void FrontEnd::handlePaneCharacter(char32_t character) {
+    TerminalTable& pane = *table();
+    switch (character) {
+    case U'j':
+        return pane.moveCursor(1);
+    case U'k':
+        return pane.moveCursor(-1);
+    case U'l':
+        return openOrScroll(pane, true);
+    case U'h':
+        return goBack(pane);
+    case U'g':
+        return pane.moveCursorTo(0);
+    case U'G':
+        return pane.moveToEnd();
+    case U'/':
+        return startFilter(pane);
+    case U's':
+        return save();
+    case U'y':
+        return copyValue(pane);
+    case U'?':
+        _isHelpShown = true;
+        _helpFirst = 0;
+        return needsDisplay();
+    case U'q':
+        return _toolkit.navigation()->isAtRoot() ? _surroundings.quit()
+                                                 : _toolkit.navigation()->back();
+    default:
+        return;
+    }
+}
+
+bool FrontEnd::moveCursor(TerminalTable& table, const KeyEvent& event) {
+    switch (event.key) {
+    case Key::Up:
+        table.moveCursor(-1);
+        return true;
+    case Key::Down:
+        table.moveCursor(1);
+        return true;
+    case Key::PageUp:
+        table.moveCursor(-table.page());
+        return true;
+    case Key::PageDown:
+        table.moveCursor(table.page());
+        return true;
+    case Key::Home:
+        table.moveCursorTo(0);
+        return true;
+    case Key::End:
+        table.moveToEnd();
+        return true;
+    default:
+        return false;
+    }
+}
+
+void FrontEnd::openOrScroll(TerminalTable& table, bool mayScroll) {
+    constexpr int kScrollColumns = 8;
+    if (mayScroll && table.scrollSideways(kScrollColumns)) {
+        return;
+    }
+    if (const auto row = table.cursorRow()) {
+        table.source().didSelectRow(row);
+    }
+}
+
+void FrontEnd::goBack(TerminalTable& table) {
+    constexpr int kScrollColumns = 8;
+    if (!table.scrollSideways(-kScrollColumns)) {
+        _toolkit.navigation()->back();
+    }
+}
+
+void FrontEnd::escape(TerminalTable& table) {
+    if (table.filter().empty()) {
+        _toolkit.navigation()->back();
+    } else {
+        table.setFilter("");
+    }
+}
+
+void FrontEnd::save() {
+    const ui::BarItems& items = _toolkit.navigation()->top().toolbarItems();
+    const auto button = std::find_if(items.begin(), items.end(), [](const ui::BarItem& item) {
+        return std::holds_alternative<ui::SaveButton>(item);
+    });
+    if (button == items.end()) {
+        _message = "Saving is not enabled here";
+        return needsDisplay();
+    }
+    const auto action = std::get<ui::SaveButton>(*button).action; // the items may be replaced
+    action();
+}
+
+void FrontEnd::copyValue(TerminalTable& table) {
+    if (const auto row = table.cursorRow()) {
+        const ui::RowText text = table.source().textOfRow(*row);
+        const std::string copied = text.value.value_or(text.name);
+        _surroundings.copy(copied);
+        _message = "Copied: " + copied;
+        needsDisplay();
+    }
+}
+
+void FrontEnd::startFilter(TerminalTable& table) {
+    LineEditor editor;
+    editor.setText(table.filter());
+    _filterEditor = std::move(editor);
+    needsDisplay();
+}
+
+} // namespace pallax::terminal

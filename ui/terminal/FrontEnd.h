@@ -1,0 +1,74 @@
+#pragma once
+
+#include "ui/terminal/Grid.h"
+#include "ui/terminal/HitMap.h"
+#include "ui/terminal/Keys.h"
+#include "ui/terminal/LineEditor.h"
+#include "ui/terminal/Marks.h"
+#include "ui/terminal/ModalView.h"
+#include "ui/terminal/TerminalToolkit.h"
+
+#include <functional>
+#include <optional>
+#include <string>
+
+namespace pallax::terminal {
+
+/// The terminal front end without a terminal: takes keys, draws to a grid. The application's
+/// controllers work through its toolkit.
+class FrontEnd {
+public:
+    /// What only the surroundings can do.
+    struct Surroundings {
+        std::function<void()> needsDisplay; ///< ask for `draw` soon; called perhaps often
+        std::function<void()> quit;
+        std::function<void(const std::string&)> copy; ///< to the clipboard
+        std::function<void()> repaint;                ///< the terminal may show something else
+    };
+
+    FrontEnd(Surroundings surroundings, const Marks& marks);
+
+    TerminalToolkit& toolkit() { return _toolkit; }
+
+    /// The terminal has this extent now.
+    void resize(int columns, int rows) { _toolkit.setSize(columns, rows); }
+    void handle(const KeyEvent& event);
+    Grid draw();
+
+    /// Whether something on the screen turns, so that `turn` is to be called now and then.
+    bool isAnimated() const;
+    void turn();
+
+private:
+    void needsDisplay();
+    void handleMouse(const KeyEvent& event);
+    void handleAlert(const KeyEvent& event);
+    void handleHelp(const KeyEvent& event);
+    void handleModal(ui::ModalScreen& screen, const KeyEvent& event);
+    void handleFilter(TerminalTable& table, const KeyEvent& event);
+    void handlePane(const KeyEvent& event);
+    void handlePaneCharacter(char32_t character);
+    bool moveCursor(TerminalTable& table, const KeyEvent& event);
+    void openOrScroll(TerminalTable& table, bool mayScroll);
+    void goBack(TerminalTable& table);
+    void escape(TerminalTable& table);
+    void save();
+    void copyValue(TerminalTable& table);
+    void startFilter(TerminalTable& table);
+    /// The topmost pane's table; null while nothing is shown.
+    TerminalTable* table() const;
+
+    Surroundings _surroundings;
+    const Marks& _marks;
+    HitMap _hits;
+    TerminalToolkit _toolkit;
+    ModalFocus _modalFocus = ModalFocus::Save;
+    bool _isHelpShown = false;
+    int _helpFirst = 0;
+    int _helpRows = 0;
+    std::optional<LineEditor> _filterEditor; ///< while a filter is being typed
+    std::optional<std::string> _message;
+    std::size_t _spinnerTurn = 0;
+};
+
+} // namespace pallax::terminal

@@ -1,0 +1,41 @@
+#pragma once
+
+#include <functional>
+#include <utility>
+#include <vector>
+
+namespace pallax::terminal {
+
+/// What a click does, by where it lands; made anew with every drawing.
+class HitMap {
+public:
+    using Action = std::function<void()>;
+
+    void clear() { _areas.clear(); }
+    /// A later area lies over an earlier one.
+    void add(int x, int y, int columns, int rows, Action action) {
+        _areas.push_back({x, y, columns, rows, std::move(action)});
+    }
+    /// The action at a place, or an empty one.
+    Action at(int x, int y) const {
+        for (auto area = _areas.rbegin(); area != _areas.rend(); ++area) {
+            if (x >= area->x && x < area->x + area->columns && y >= area->y &&
+                y < area->y + area->rows) {
+                return area->action;
+            }
+        }
+        return {};
+    }
+
+private:
+    struct Area {
+        int x;
+        int y;
+        int columns;
+        int rows;
+        Action action;
+    };
+    std::vector<Area> _areas;
+};
+
+} // namespace pallax::terminal

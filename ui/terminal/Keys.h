@@ -1,0 +1,39 @@
+#pragma once
+
+namespace pallax::terminal {
+
+enum class Key {
+    Character,
+    Enter,
+    Escape,
+    Backspace,
+    Delete,
+    Tab,
+    BackTab,
+    Up,
+    Down,
+    Left,
+    Right,
+    PageUp,
+    PageDown,
+    Home,
+    End,
+    Click,
+    WheelUp,
+    WheelDown,
+};
+
+/// What the user did: a key, or something with the mouse.
+struct KeyEvent {
+    Key key = Key::Character;
+    char32_t character = 0; ///< of Key::Character; below U+0020 with the control key
+    int x = 0;              ///< the column of a mouse event
+    int y = 0;              ///< its row
+};
+
+/// The character that a letter sends with the control key.
+constexpr char32_t controlKey(char letter) {
+    return static_cast<char32_t>(letter - 'a' + 1);
+}
+
+} // namespace pallax::terminal

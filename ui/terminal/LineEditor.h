@@ -1,0 +1,40 @@
+#pragma once
+
+#include "ui/terminal/Keys.h"
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+namespace pallax::terminal {
+
+/// A line of UTF-8 text that is edited, with the cursor between two characters; a character and
+/// the combining ones behind it are moved over and deleted as one.
+class LineEditor {
+public:
+    /// Longer texts are not taken: what is typed beyond is dropped.
+    static constexpr std::size_t kMaximumBytes = 4096;
+
+    const std::string& text() const { return _text; }
+    /// The cursor's place, as an offset in bytes.
+    std::size_t cursor() const { return _cursor; }
+    /// Replaces the text; the cursor stands behind it.
+    void setText(std::string text);
+
+    /// Takes an editing key; false when it is none. Besides the arrows, Home, End, Backspace and
+    /// Delete these are Ctrl-A, -E, -B, -F, -D, -H, -K, -U and -W, as in a shell.
+    bool handle(const KeyEvent& event);
+
+private:
+    bool handleControl(char32_t character);
+    bool insert(char32_t character);
+    void erase(std::size_t from, std::size_t to);
+    std::size_t before() const;
+    std::size_t after() const;
+    std::size_t wordStart() const;
+
+    std::string _text;
+    std::size_t _cursor = 0;
+};
+
+} // namespace pallax::terminal

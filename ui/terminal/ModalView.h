@@ -1,0 +1,30 @@
+#pragma once
+
+#include "platform/ui/ModalScreen.h"
+#include "ui/terminal/Box.h"
+#include "ui/terminal/HitMap.h"
+
+namespace pallax::terminal {
+
+/// Which part of a modal screen has the keys, while its text field is not edited.
+enum class ModalFocus { Save, Cancel };
+
+/// Draws the modal screen over what is there: the list, the text field, and the two buttons.
+class ModalView {
+public:
+    ModalView(Grid& grid, const Marks& marks, HitMap& hits)
+        : _grid(grid), _marks(marks), _hits(hits) {}
+
+    void draw(ui::ModalScreen& screen, ModalFocus focus);
+
+private:
+    void drawList(ui::ModalScreen& screen, const Box& box, int rows);
+    void drawField(ui::ModalScreen& screen, const Box& box, int y);
+    void drawButtons(ui::ModalScreen& screen, const Box& box, int y, ModalFocus focus);
+
+    Grid& _grid;
+    const Marks& _marks;
+    HitMap& _hits;
+};
+
+} // namespace pallax::terminal

@@ -1,0 +1,11 @@
+#include "ui/terminal/TerminalMetrics.h"
+
+#include "ui/terminal/TextWidth.h"
+
+namespace pallax::terminal {
+
+ui::Size TerminalMetrics::measure(std::string_view text, const ui::Font& /*font*/) const {
+    return {columnsOf(text) * kPointsPerColumn, kPointsPerRow};
+}
+
+} // namespace pallax::terminal

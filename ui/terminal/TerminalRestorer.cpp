@@ -1,0 +1,63 @@
+#include "ui/terminal/TerminalRestorer.h"
+
+#include <algorithm>
+#include <array>
+#include <csignal>
+#include <cstddef>
+#include <termios.h>
+#include <unistd.h>
+
+namespace pallax::terminal {
+
+namespace {
+
+constexpr std::array kDeadly{SIGSEGV, SIGBUS, SIGFPE, SIGILL, SIGABRT, SIGQUIT};
+constexpr std::size_t kMaximumSequence = 256;
+
+/// A signal handler can reach nothing but what is global.
+struct Restoration {
+    int descriptor = -1;
+    termios modes{};
+    bool hasModes = false;
+    std::array<char, kMaximumSequence> sequence{};
+    std::size_t size = 0;
+};
+Restoration restoration;
+
+} // namespace
+
+extern "C" {
+/// Calls only what is safe in a signal handler. The signal's own action is back by then.
+static void restoreAndDie(int signal) {
+    (void)!::write(restoration.descriptor, restoration.sequence.data(), restoration.size);
+    if (restoration.hasModes) {
+        (void)::tcsetattr(restoration.descriptor, TCSANOW, &restoration.modes);
+    }
+    (void)std::raise(signal);
+}
+}
+
+TerminalRestorer::TerminalRestorer(int descriptor) {
+    restoration.descriptor = descriptor;
+    restoration.hasModes = ::tcgetattr(descriptor, &restoration.modes) == 0;
+    restoration.size = 0;
+    struct sigaction action {};
+    action.sa_handler = restoreAndDie;
+    action.sa_flags = static_cast<int>(SA_RESETHAND);
+    for (const int signal : kDeadly) {
+        (void)::sigaction(signal, &action, nullptr);
+    }
+}
+
+TerminalRestorer::~TerminalRestorer() {
+    for (const int signal : kDeadly) {
+        (void)std::signal(signal, SIG_DFL);
+    }
+}
+
+void TerminalRestorer::setSequence(std::string_view sequence) {
+    restoration.size = std::min(sequence.size(), kMaximumSequence);
+    std::copy_n(sequence.begin(), restoration.size, restoration.sequence.begin());
+}
+
+} // namespace pallax::terminal

@@ -1,0 +1,21 @@
+#pragma once
+
+#include <string_view>
+
+namespace pallax::terminal {
+
+/// Restores the terminal when the process dies of a signal (a crash, an abort, Ctrl-\), and then
+/// lets it die of it. One at a time; the destructor gives the signals back.
+class TerminalRestorer {
+public:
+    /// `descriptor` is the terminal, as it was before anything was drawn.
+    explicit TerminalRestorer(int descriptor);
+    ~TerminalRestorer();
+    TerminalRestorer(const TerminalRestorer&) = delete;
+    TerminalRestorer& operator=(const TerminalRestorer&) = delete;
+
+    /// What is written to the terminal; nothing at first.
+    void setSequence(std::string_view sequence);
+};
+
+} // namespace pallax::terminal
