@@ -1,0 +1,177 @@
+#include "app/PallaxApp.h"
+
+#include "platform/Clock.h"
+#include "platform/FileSystem.h"
+#include "platform/MainQueue.h"
+#include "platform/Preferences.h"
+#include "platform/ui/Toolkit.h"
+
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr const char* kNotConnected = "Connecting...";
+/// The root pane's first status, without dots, unlike every later one.
+constexpr const char* kLaunching = "Connecting";
+constexpr const char* kUpdatePattern = "'Updated' yyyy-MM-dd 'at' HH:mm:ss";
+constexpr const char* kRootPath = "/";
+
+constexpr std::string_view kHomeScreenDomain = "com.norvane.plinthe";
+constexpr std::string_view kShowGSMRSSI = "PLShowGSMRSSI";
+
+/// The screens of the stack are panes, all of them made here or by another pane.
+PallaxPaneController& paneOf(ui::TableScreen& screen) {
+    return dynamic_cast<PallaxPaneController&>(screen);
+}
+
+} // namespace
+
+PallaxApp::PallaxApp(Surroundings surroundings)
+    : _surroundings(std::move(surroundings)), _alive(std::make_shared<PallaxApp*>(this)) {}
+
+PallaxApp::~PallaxApp() {
+    if (_navController) {
+        _navController->setDelegate(nullptr);
+    }
+}
+
+std::function<void()> PallaxApp::whileAlive(void (PallaxApp::*action)()) {
+    return [app = std::weak_ptr(_alive), action] {
+        if (const auto alive = app.lock()) {
+            ((*alive)->*action)();
+        }
+    };
+}
+
+void PallaxApp::applicationDidFinishLaunching() {
+    ui::Toolkit& toolkit = _surroundings.toolkit;
+    getSaveButtonPref();
+    setWindow(toolkit.makeWindow(toolkit.screenBounds()));
+    _model = _surroundings.makeModel(*this);
+    setUpdateMessage(kNotConnected);
+    _dateFormatter = std::make_unique<DateFormatter>(kUpdatePattern, _surroundings.clock);
+
+    auto root = std::make_shared<PallaxPaneController>(toolkit, *this, nullptr, kRootPath);
+    root->setStatus(kLaunching, true);
+    _navController = toolkit.makeNavigationStack(std::move(root));
+    _navController->setDelegate(this);
+    _window->setRoot(*_navController);
+    _window->addView(*_navController);
+    _window->makeKeyAndVisible();
+
+    // Connecting waits until the first screen is drawn.
+    _surroundings.queue.async(whileAlive(&PallaxApp::restartMonitor));
+}
+
+void PallaxApp::restartMonitor() {
+    if (_model) {
+        _model->restartMonitor();
+    }
+}
+
+void PallaxApp::applicationWillTerminate() {
+    _setGSMRSSI(false);
+    setUpdateMessage(std::nullopt);
+    _dateFormatter.reset();
+    setSaveViewController(nullptr);
+    if (_window) {
+        _window->takeOffScreen();
+    }
+    setWindow(nullptr);
+    _model.reset();
+}
+
+void PallaxApp::getSaveButtonPref() {
+    setAllowSaveButton(_surroundings.files.exists(_surroundings.saveButtonMarker));
+}
+
+void PallaxApp::_setGSMRSSI(bool shown) {
+    Preferences& preferences = _surroundings.preferences;
+    preferences.setValue(kShowGSMRSSI, PropertyList::boolean(shown), kHomeScreenDomain);
+    (void)preferences.synchronize(kHomeScreenDomain); // on failure there is nobody to tell
+    preferences.postChangedNotice(kHomeScreenDomain, kShowGSMRSSI);
+}
+
+void PallaxApp::showSaveView() {
+    if (_saveViewController) {
+        return;
+    }
+    setSaveViewController(std::make_shared<PallaxSaveViewController>(
+        PallaxSaveViewController::Surroundings{
+            .toolkit = _surroundings.toolkit,
+            .files = _surroundings.files,
+            .clock = _surroundings.clock,
+            .queue = _surroundings.queue,
+            .snapshotDirectory = _surroundings.snapshotDirectory,
+            .closeSaveView = whileAlive(&PallaxApp::closeSaveView),
+        },
+        _model ? _model->getSaveContents() : PropertyList()));
+    if (_navController) {
+        _navController->presentModal(_saveViewController, true);
+    }
+}
+
+void PallaxApp::closeSaveView() {
+    if (!_saveViewController) {
+        return;
+    }
+    if (_navController) {
+        _navController->dismissModal(true);
+    }
+    setSaveViewController(nullptr);
+}
+
+void PallaxApp::updateStatusForViewController(PallaxPaneController& pane) {
+    if (isConnected()) {
+        pane.setStatus(updateMessage(), false);
+    } else {
+        pane.setStatus(kNotConnected, true);
+    }
+}
+
+void PallaxApp::updateViewControllerFromModel() {
+    if (!_navController) {
+        return;
+    }
+    reloadPanes();
+    if (isConnected()) {
+        setUpdateMessage(_dateFormatter->stringFromDate(_surroundings.clock.now()));
+    }
+    updateTopStatus();
+}
+
+NodeRef PallaxApp::nodeOf(const PallaxPaneController& pane, std::size_t index) {
+    if (!_model) {
+        return nullptr;
+    }
+    return index == 0 ? _model->topLevelNodes() : _model->nodeAtPath(pane.path());
+}
+
+void PallaxApp::reloadPanes() {
+    const auto panes = _navController->screens(); // a copy: popping changes the stack's own
+    for (std::size_t index = 0; index < panes.size(); ++index) {
+        PallaxPaneController& pane = paneOf(*panes[index]);
+        NodeRef node = nodeOf(pane, index);
+        if (index > 0 && !node) {
+            _navController->popTo(index - 1, true);
+            return;
+        }
+        pane.reloadWithNode(std::move(node));
+    }
+}
+
+void PallaxApp::updateTopStatus() {
+    const auto& screens = _navController->screens();
+    if (!screens.empty()) {
+        updateStatusForViewController(paneOf(*screens.back()));
+    }
+}
+
+void PallaxApp::navigationControllerWillShow(ui::NavigationStack& /*stack*/,
+                                             ui::TableScreen& screen, bool /*animated*/) {
+    updateStatusForViewController(paneOf(screen));
+}
+
+} // namespace pallax

@@ -1,0 +1,124 @@
+#include "app/PallaxSaveViewController.h"
+
+#include "platform/Clock.h"
+#include "platform/FileSystem.h"
+#include "platform/Format.h"
+#include "platform/MainQueue.h"
+#include "platform/SystemLog.h"
+
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kLayoutName = "PallaxSaveViewController";
+constexpr const char* kCellIdentifier = "SaveHistoryContentCell";
+constexpr ui::Font kItemFont{ui::FontFace::Helvetica, 13};
+constexpr std::string_view kDescriptionKey = "Description";
+
+} // namespace
+
+PallaxSaveViewController::PallaxSaveViewController(Surroundings surroundings,
+                                                   const PropertyList& saveHistory)
+    : ModalScreen(surroundings.toolkit, kLayoutName), _surroundings(std::move(surroundings)),
+      _timeStamp(dateOf(_surroundings.clock.now())), _saveHistory(saveHistory.shallowCopy()) {}
+
+Dictionary PallaxSaveViewController::snapshot(const PropertyList& timestamp,
+                                              const PropertyList& data,
+                                              const PropertyList& description) {
+    const std::pair<std::string_view, const PropertyList&> entries[] = {
+        {"Timestamp", timestamp}, {"Data", data}, {kDescriptionKey, description}};
+    Dictionary root;
+    for (const auto& [key, value] : entries) {
+        if (value.isNull()) {
+            break;
+        }
+        root.setFixed(key, value);
+    }
+    return root;
+}
+
+void PallaxSaveViewController::viewDidLoad() {
+    saveDescription().setDelegate(this);
+    ModalScreen::viewDidLoad();
+    saveContentTable().sizeToFit();
+}
+
+void PallaxSaveViewController::viewWillAppear(bool /*animated*/) {
+    view().setFrame(_surroundings.toolkit.applicationFrame());
+}
+
+std::string PallaxSaveViewController::snapshotPath() const {
+    return formatText("%@/PallaxSnapshot-%ld.pallax",
+                      {_surroundings.snapshotDirectory,
+                       dateOf(_surroundings.clock.now()).time_since_epoch().count()});
+}
+
+void PallaxSaveViewController::savePressed() {
+    const Dictionary root = snapshot(dateText(_timeStamp), _saveHistory, saveDescription().text());
+    const std::string path = snapshotPath();
+    if (!_surroundings.files.writePropertyList(path, root)) {
+        reportFailure(path);
+    }
+    _surroundings.queue.async(_surroundings.closeSaveView);
+}
+
+void PallaxSaveViewController::reportFailure(const std::string& path) {
+    systemLog(LogPriority::Error, "Unable to write snapshot to %s", path);
+    _surroundings.toolkit.showAlert({"File Error", "Unable to write file to disk", "Close"});
+}
+
+void PallaxSaveViewController::cancelPressed() {
+    _surroundings.queue.async(_surroundings.closeSaveView);
+}
+
+void PallaxSaveViewController::backgroundTouched() {
+    saveDescription().resignFirstResponder();
+}
+
+bool PallaxSaveViewController::textFieldShouldReturn(ui::TextField& field) {
+    field.resignFirstResponder();
+    return true;
+}
+
+std::size_t PallaxSaveViewController::numberOfRows() const {
+    const ArrayRef items = _saveHistory.array();
+    return items ? items->size() : 0;
+}
+
+std::string PallaxSaveViewController::descriptionOf(std::size_t row) const {
+    std::string text;
+    if (row < numberOfRows()) {
+        const DictionaryRef item = (*_saveHistory.array())[row].dictionary();
+        const PropertyList* description = item ? item->find(kDescriptionKey) : nullptr;
+        if (description != nullptr) {
+            description->appendString(text);
+        }
+    }
+    return text;
+}
+
+std::shared_ptr<ui::TableCell> PallaxSaveViewController::cellForRow(std::size_t row) {
+    std::shared_ptr<ui::TableCell> cell = saveContentTable().dequeueReusableCell(kCellIdentifier);
+    if (!cell) {
+        cell = std::make_shared<ui::TableCell>(ui::CellStyle::Plain, kCellIdentifier);
+        cell->setContentBounds(saveContentTable().contentBounds());
+    }
+    cell->textLabel().text = descriptionOf(row);
+    cell->textLabel().font = kItemFont;
+    cell->setAccessory(ui::CellAccessory::Checkmark);
+    return cell;
+}
+
+ui::RowText PallaxSaveViewController::textOfRow(std::size_t row) const {
+    ui::RowText text;
+    text.name = descriptionOf(row);
+    return text;
+}
+
+void PallaxSaveViewController::didSelectRow(std::optional<std::size_t> /*row*/) {
+    saveDescription().resignFirstResponder();
+}
+
+} // namespace pallax
