@@ -41,6 +41,16 @@ PallaxCell::PallaxCell(Kind kind, std::string reuseIdentifier, const ui::TextMet
     }
 }
 
+ui::CellContents PallaxCell::contents() const {
+    ui::CellContents contents{{}, _view.get()};
+    for (const ui::Label* label : {_key.get(), _value.get()}) {
+        if (label != nullptr) {
+            contents.labels.push_back(label);
+        }
+    }
+    return contents;
+}
+
 ui::Size PallaxCell::measured(const std::shared_ptr<ui::Label>& label) const {
     return label ? _metrics.measure(label->text, kMeasuringFont) : ui::Size{};
 }

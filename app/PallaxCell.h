@@ -37,6 +37,9 @@ public:
     /// branch cell.
     const std::shared_ptr<ui::ScrollContainer>& view() const { return _view; }
 
+    /// The labels that it has; with a container, their places are in its content.
+    ui::CellContents contents() const override;
+
     /// Lays out a branch row: the key alone, whatever else the cell has.
     void setLayoutKey();
     /// Lays out a leaf row: the value flush right, or behind the key in a row that scrolls.

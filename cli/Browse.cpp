@@ -1,29 +1,22 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "cli/FatalRecord.h"
+#include "cli/Output.h"
 #include "cli/Preconditions.h"
+#include "cli/PrintBrowser.h"
 #include "cli/Programs.h"
 #include "cli/ScopedLog.h"
+#include "cli/ScreenBrowser.h"
 #include "cli/Settings.h"
 #include "cli/TeeSink.h"
-#include "cli/TreePrinter.h"
-#include "host/AsioMainQueue.h"
-#include "host/BuildBundle.h"
-#include "host/DirectoryResources.h"
 #include "host/LogSinks.h"
 #include "host/Recording.h"
-#include "host/SocketMessagePorts.h"
-#include "host/SourceClock.h"
-#include "host/WallClock.h"
-#include "monitor/PallaxModel.h"
-#include "platform/StandardOutput.h"
 #include "telephony/ChildService.h"
-#include "telephony/SocketTelephonyService.h"
 
 #include <algorithm>
-#include <csignal>
 #include <memory>
-#include <sys/wait.h>
+#include <stdexcept>
 #include <unistd.h>
+#include <utility>
 
 namespace pallax {
 
@@ -31,97 +24,6 @@ namespace {
 
 /// What the machine's log gets: failures. Every packet makes several lines of less urgency.
 constexpr int kSyslogLevel = static_cast<int>(LogPriority::Error);
-
-/// How often the connection and the child service are looked at.
-constexpr std::chrono::milliseconds kLookInterval{500};
-
-/// What generators print when they end goes where the tree goes.
-class PrintedNotices final : public StandardOutput {
-public:
-    explicit PrintedNotices(Output& output) : _output(output) {}
-    void printLine(std::string_view line) override {
-        _output.text() += line;
-        _output.text() += '\n';
-    }
-
-private:
-    Output& _output;
-};
-
-/// True once the child has ended; it is left to its owner to reap.
-bool hasEnded(const ChildService& child) {
-    siginfo_t info{};
-    const auto process = static_cast<id_t>(child.processId());
-    return ::waitid(P_PID, process, &info, WEXITED | WNOHANG | WNOWAIT) == 0 && info.si_pid != 0;
-}
-
-/// A model over the message ports of this machine, and the printer that shows it.
-class Browser {
-public:
-    Browser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-            Output& output)
-        : _child(child),
-          _localPortName(child != nullptr ? child->privateName(PallaxModel::kLocalPortName)
-                                          : std::string(PallaxModel::kLocalPortName)),
-          _clock(_wallClock, _queue), _socketPorts(_queue, std::move(directory), &_clock),
-          _ports(_socketPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
-          _telephony(_socketPorts, child != nullptr ? child->controlPortName()
-                                                    : std::string(kTelephonyControlPort)),
-          _resources(DirectoryResources::programFolder()), _notices(output),
-          _printer(output, _clock, [this] { return _model.topLevelNodes(); }),
-          _model({_ports,
-                  _telephony,
-                  _queue,
-                  _clock,
-                  {_clock, _resources, _bundle, _notices},
-                  technologies(),
-                  _printer,
-                  _localPortName}) {}
-
-    /// Browses until a signal, or with a child until its recording has ended. False when the
-    /// child ended before.
-    bool run() {
-        _queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [this](int /*signal*/) { _queue.stop(); });
-        if (_child != nullptr) {
-            // The last tick has posted its view update before; that is to come first.
-            _clock.onEnd([this] { _queue.async([this] { _queue.stop(); }); });
-        }
-        _queue.async([this] {
-            _model.startMonitor();
-            _printer.showConnection(_model.isConnected());
-        });
-        const auto looks = _queue.scheduleRepeating(kLookInterval, [this] { look(); });
-        _queue.run();
-        return !_childLost;
-    }
-
-private:
-    void look() {
-        _printer.showConnection(_model.isConnected());
-        if (_child != nullptr && hasEnded(*_child)) {
-            // A signal to the whole process group may be on its way to us too.
-            _queue.after(kLookInterval, [this] {
-                _childLost = true;
-                _queue.stop();
-            });
-        }
-    }
-
-    ChildService* _child;
-    std::string _localPortName;
-    bool _childLost = false;
-    AsioMainQueue _queue;
-    WallClock _wallClock;
-    SourceClock _clock;
-    SocketMessagePorts _socketPorts;
-    GuardedMessagePorts _ports;
-    SocketTelephonyService _telephony;
-    DirectoryResources _resources;
-    BuildBundle _bundle;
-    PrintedNotices _notices;
-    TreePrinter _printer;
-    PallaxModel _model;
-};
 
 /// Ends the child, and says what it had to complain of; true when that was nothing.
 bool endChild(ChildService& child) {
@@ -131,28 +33,59 @@ bool endChild(ChildService& child) {
     return complaints.empty();
 }
 
-ExitStatus browse(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child) {
+/// What the command line and the settings file ask for.
+struct Request {
+    const BrowseOptions& options;
+    const Settings& settings;
+    OnFatalRecord onFatalRecord;
+    bool isOnScreen;
+};
+
+/// False when the child (null where the machine's own service is asked) ended too early.
+bool browseInPrint(const Request& request, SocketDirectory directory, ChildService* child) {
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
-    bool whole = false;
+    bool isWhole = false;
     try {
-        Browser browser(std::move(directory), onFatalRecord, child, output);
-        whole = browser.run();
+        PrintBrowser browser(std::move(directory), request.onFatalRecord, child, output);
+        isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // what was printed, and the generators' last words
+        throw;
+    }
+    output.flush();
+    return isWhole;
+}
+
+/// As `browseInPrint`. The terminal is restored by the time anything else is told.
+bool browseOnScreen(const Request& request, SocketDirectory directory, ChildService* child) {
+    auto terminal = terminal::CursesTerminal::open({request.options.color, request.options.mouse});
+    if (!terminal) {
+        throw std::runtime_error(terminal.error().sentence);
+    }
+    ScreenBrowser browser(std::move(directory), request.onFatalRecord, child, request.settings,
+                          **terminal);
+    return browser.run();
+}
+
+ExitStatus browse(const Request& request, SocketDirectory directory, ChildService* child) {
+    bool isWhole = false;
+    try {
+        isWhole = request.isOnScreen ? browseOnScreen(request, std::move(directory), child)
+                                     : browseInPrint(request, std::move(directory), child);
+    } catch (const FatalRecord&) {
         if (child != nullptr) {
             (void)endChild(*child);
         }
         throw;
     }
-    output.flush();
     if (child == nullptr) {
         return kExitSuccess;
     }
-    const bool contented = endChild(*child);
-    if (!whole) {
+    const bool isContented = endChild(*child);
+    if (!isWhole) {
         complain("The service that plays the recording has ended.");
     }
-    return whole && contented ? kExitSuccess : kExitFailure;
+    return isWhole && isContented ? kExitSuccess : kExitFailure;
 }
 
 /// Why the recording cannot be browsed although it can be read; nothing when it can, or when only
@@ -174,14 +107,15 @@ std::optional<std::string> refusalOf(const std::string& path) {
     return noGeneratorSentence((*recording)->name(), identifier);
 }
 
-ExitStatus browseWithLog(const BrowseOptions& options, OnFatalRecord onFatalRecord) {
-    if (const auto refusal = options.recording ? refusalOf(*options.recording) : std::nullopt) {
+ExitStatus browseWithLog(const Request& request) {
+    const std::optional<std::string>& recording = request.options.recording;
+    if (const auto refusal = recording ? refusalOf(*recording) : std::nullopt) {
         complain(*refusal);
         return kExitFailure;
     }
     std::unique_ptr<ChildService> child;
-    if (options.recording) {
-        auto started = ChildService::start({*options.recording, options.play});
+    if (recording) {
+        auto started = ChildService::start({*recording, request.options.play});
         if (!started) {
             complain(started.error().sentence);
             return kExitFailure;
@@ -193,7 +127,7 @@ ExitStatus browseWithLog(const BrowseOptions& options, OnFatalRecord onFatalReco
         complain(directory.error().sentence);
         return kExitFailure;
     }
-    return browse(std::move(directory).value(), onFatalRecord, child.get());
+    return browse(request, std::move(directory).value(), child.get());
 }
 
 } // namespace
@@ -208,17 +142,23 @@ ExitStatus runBrowse(const BrowseOptions& options) {
         complain(*missing);
         return kExitFailure;
     }
-    const OnFatalRecord onFatalRecord =
-        options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord;
+    const Request request{options, *settings,
+                          options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,
+                          !options.print && terminal::CursesTerminal::isPossible()};
     SyslogSink syslog("pallax");
     if (!options.logLevel) {
         const ScopedLog log(syslog, kSyslogLevel);
-        return browseWithLog(options, onFatalRecord);
+        return browseWithLog(request);
+    }
+    if (request.isOnScreen && ::isatty(STDERR_FILENO) != 0) {
+        complain("--log-level writes to standard error, which is the screen here: send it to a "
+                 "file (2>FILE), or add --print.");
+        return kExitWrongUsage;
     }
     StderrSink standardError;
     TeeSink both(syslog, kSyslogLevel, standardError, *options.logLevel);
     const ScopedLog log(both, std::max(kSyslogLevel, *options.logLevel));
-    return browseWithLog(options, onFatalRecord);
+    return browseWithLog(request);
 }
 
 } // namespace pallax

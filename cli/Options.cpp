@@ -79,7 +79,15 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
                "A recording (pcap or pcapng; - is standard input) to browse as it is played; "
                "without one, the live modem")
             ->type_name("");
-    app.add_flag("--print", options.print, "Print the tree as text at each display tick");
+    app.add_flag("--print", options.print,
+                 "Print the tree as text at each display tick, as is done without a terminal");
+    addChoice<terminal::ColorUse>(app, "--color", options.color,
+                                  {{"auto", terminal::ColorUse::Auto},
+                                   {"always", terminal::ColorUse::Always},
+                                   {"never", terminal::ColorUse::Never}},
+                                  "Colour on the screen (default: auto, unless NO_COLOR is set)");
+    app.add_flag("!--no-mouse", options.mouse,
+                 "Leave the mouse to the terminal, so that text can be selected");
     addPlay(app, options.play, recording);
     app.add_flag("--keep-going", options.keepGoing,
                  "Drop a record that cannot be read instead of ending with status 70");

@@ -3,6 +3,7 @@
 #include "cli/DecodeCommand.h"
 #include "cli/ExitStatus.h"
 #include "telephony/Service.h"
+#include "ui/terminal/CursesTerminal.h"
 
 #include <optional>
 #include <string>
@@ -15,6 +16,8 @@ struct BrowseOptions {
     std::optional<std::string> recording; ///< without one, the live modem
     PlayOptions play;
     bool print = false;
+    terminal::ColorUse color = terminal::ColorUse::Auto;
+    bool mouse = true;
     bool keepGoing = false;
     std::optional<int> logLevel; ///< system-log lines up to it go to standard error
 };

@@ -34,7 +34,7 @@ Grid FrontEnd::draw() {
         return grid;
     }
     const LineEditor* editor = _filterEditor ? &*_filterEditor : nullptr;
-    PaneView(grid, _marks, _hits).draw(*navigation, {_spinnerTurn, editor, _message});
+    PaneView(grid, _marks, _hits).draw(*navigation, {_spinnerTurn, editor, _message, _note});
     if (const auto& modal = navigation->modal()) {
         ModalView(grid, _marks, _hits).draw(*modal, _modalFocus);
     }
@@ -45,6 +45,11 @@ Grid FrontEnd::draw() {
         drawAlert(grid, _marks, *alert);
     }
     return grid;
+}
+
+void FrontEnd::setNote(std::string note) {
+    _note = std::move(note);
+    needsDisplay();
 }
 
 bool FrontEnd::isAnimated() const {

@@ -35,6 +35,9 @@ public:
     void handle(const KeyEvent& event);
     Grid draw();
 
+    /// A few words behind the status text, from now on.
+    void setNote(std::string note);
+
     /// Whether something on the screen turns, so that `turn` is to be called now and then.
     bool isAnimated() const;
     void turn();
@@ -68,6 +71,7 @@ private:
     int _helpRows = 0;
     std::optional<LineEditor> _filterEditor; ///< while a filter is being typed
     std::optional<std::string> _message;
+    std::string _note;
     std::size_t _spinnerTurn = 0;
 };
 

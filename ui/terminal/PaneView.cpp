@@ -181,8 +181,10 @@ int PaneView::drawStatus(const ui::BarItems& items, const PaneStatus& status) {
     if (isLoading(items)) {
         x = _grid.put(x, y, _marks.spinner.at(status.spinnerTurn % _marks.spinner.size())) + 1;
     }
-    const ui::Label* label = labelOf(items);
-    return label == nullptr ? x : _grid.put(x, y, label->text);
+    if (const ui::Label* label = labelOf(items)) {
+        x = _grid.put(x, y, label->text);
+    }
+    return status.note.empty() ? x : _grid.put(x + 2, y, status.note, kDim);
 }
 
 /// The keys that matter here, as many as fit behind the status.

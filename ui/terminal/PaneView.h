@@ -19,6 +19,7 @@ struct PaneStatus {
     std::size_t spinnerTurn = 0;              ///< counts up while the spinner turns
     const LineEditor* filterEditor = nullptr; ///< while a filter is being typed
     std::optional<std::string> message;       ///< in the status text's place
+    std::string note;                         ///< behind the status text
 };
 
 /// Whether the toolbar's activity indicator turns.

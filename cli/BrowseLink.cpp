@@ -1,0 +1,37 @@
+#include "cli/BrowseLink.h"
+
+#include "LogGenerator/Technologies/Technologies.h"
+#include "telephony/ChildService.h"
+
+#include <sys/wait.h>
+#include <utility>
+
+namespace pallax {
+
+BrowseLink::BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
+                       StandardOutput& notices)
+    : _child(child), _notices(notices),
+      _localPortName(child != nullptr ? child->privateName(PallaxModel::kLocalPortName)
+                                      : std::string(PallaxModel::kLocalPortName)),
+      _clock(_wallClock, _queue), _socketPorts(_queue, std::move(directory), &_clock),
+      _ports(_socketPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
+      _telephony(_socketPorts,
+                 child != nullptr ? child->controlPortName() : std::string(kTelephonyControlPort)),
+      _resources(DirectoryResources::programFolder()) {}
+
+PallaxModel::Platform BrowseLink::modelPlatform(ModelObserver& observer) {
+    return {
+        _ports,         _telephony, _queue,        _clock, {_clock, _resources, _bundle, _notices},
+        technologies(), observer,   _localPortName};
+}
+
+bool BrowseLink::childHasEnded() const {
+    if (_child == nullptr) {
+        return false;
+    }
+    siginfo_t info{};
+    const auto process = static_cast<id_t>(_child->processId());
+    return ::waitid(P_PID, process, &info, WEXITED | WNOHANG | WNOWAIT) == 0 && info.si_pid != 0;
+}
+
+} // namespace pallax

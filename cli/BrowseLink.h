@@ -1,0 +1,50 @@
+#pragma once
+
+#include "cli/FatalRecord.h"
+#include "host/AsioMainQueue.h"
+#include "host/BuildBundle.h"
+#include "host/DirectoryResources.h"
+#include "host/SocketMessagePorts.h"
+#include "host/SourceClock.h"
+#include "host/WallClock.h"
+#include "monitor/PallaxModel.h"
+#include "telephony/SocketTelephonyService.h"
+
+#include <string>
+
+namespace pallax {
+
+class ChildService;
+class StandardOutput;
+
+/// What a model needs of this machine to browse: the main queue, the ports to the telephony
+/// service (a child's or the machine's), the source's clock, and the templates.
+class BrowseLink {
+public:
+    /// `child` is null for the machine's own service. What is referred to outlives the link.
+    BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
+               StandardOutput& notices);
+
+    AsioMainQueue& queue() { return _queue; }
+    SourceClock& clock() { return _clock; }
+    PallaxModel::Platform modelPlatform(ModelObserver& observer);
+
+    bool hasChild() const { return _child != nullptr; }
+    /// True once the child has ended; it is left to its owner to reap.
+    bool childHasEnded() const;
+
+private:
+    ChildService* _child;
+    StandardOutput& _notices;
+    std::string _localPortName;
+    AsioMainQueue _queue;
+    WallClock _wallClock;
+    SourceClock _clock;
+    SocketMessagePorts _socketPorts;
+    GuardedMessagePorts _ports;
+    SocketTelephonyService _telephony;
+    DirectoryResources _resources;
+    BuildBundle _bundle;
+};
+
+} // namespace pallax

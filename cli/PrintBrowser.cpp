@@ -1,0 +1,56 @@
+#include "cli/PrintBrowser.h"
+
+#include "cli/Output.h"
+
+#include <chrono>
+#include <csignal>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+/// How often the connection and the child service are looked at.
+constexpr std::chrono::milliseconds kLookInterval{500};
+
+} // namespace
+
+void PrintBrowser::Notices::printLine(std::string_view line) {
+    _output.text() += line;
+    _output.text() += '\n';
+}
+
+PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
+                           ChildService* child, Output& output)
+    : _notices(output), _link(std::move(directory), onFatalRecord, child, _notices),
+      _printer(output, _link.clock(), [this] { return _model.topLevelNodes(); }),
+      _model(_link.modelPlatform(_printer)) {}
+
+bool PrintBrowser::run() {
+    AsioMainQueue& queue = _link.queue();
+    queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [&queue](int /*signal*/) { queue.stop(); });
+    if (_link.hasChild()) {
+        // The last tick has posted its view update before; that is to come first.
+        _link.clock().onEnd([&queue] { queue.async([&queue] { queue.stop(); }); });
+    }
+    queue.async([this] {
+        _model.startMonitor();
+        _printer.showConnection(_model.isConnected());
+    });
+    const auto looks = queue.scheduleRepeating(kLookInterval, [this] { look(); });
+    queue.run();
+    return !_childLost;
+}
+
+void PrintBrowser::look() {
+    _printer.showConnection(_model.isConnected());
+    if (_link.childHasEnded()) {
+        // A signal to the whole process group may be on its way to us too.
+        _link.queue().after(kLookInterval, [this] {
+            _childLost = true;
+            _link.queue().stop();
+        });
+    }
+}
+
+} // namespace pallax

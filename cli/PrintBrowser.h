@@ -1,0 +1,42 @@
+#pragma once
+
+#include "cli/BrowseLink.h"
+#include "cli/TreePrinter.h"
+#include "monitor/PallaxModel.h"
+#include "platform/StandardOutput.h"
+
+namespace pallax {
+
+class Output;
+
+/// Browses without a terminal: a model, and the printer that shows it.
+class PrintBrowser {
+public:
+    PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
+                 Output& output);
+
+    /// Browses until a signal, or with a child until its recording has ended. False when the
+    /// child ended before.
+    bool run();
+
+private:
+    /// What generators print when they end goes where the tree goes.
+    class Notices final : public StandardOutput {
+    public:
+        explicit Notices(Output& output) : _output(output) {}
+        void printLine(std::string_view line) override;
+
+    private:
+        Output& _output;
+    };
+
+    void look();
+
+    bool _childLost = false;
+    Notices _notices;
+    BrowseLink _link;
+    TreePrinter _printer;
+    PallaxModel _model;
+};
+
+} // namespace pallax

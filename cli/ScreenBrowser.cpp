@@ -1,0 +1,129 @@
+#include "cli/ScreenBrowser.h"
+
+#include "cli/Settings.h"
+
+#include <chrono>
+#include <csignal>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::chrono::milliseconds kTurnInterval{150};
+/// How often it is looked whether the child service is still there.
+constexpr std::chrono::milliseconds kLookInterval{500};
+
+} // namespace
+
+ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
+                             ChildService* child, const Settings& settings,
+                             terminal::CursesTerminal& terminal)
+    : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, _notices),
+      _keys(_link.queue(), terminal.inputDescriptor()),
+      _frontEnd({[this] { needsDisplay(); }, [this] { _link.queue().stop(); },
+                 [this](const std::string& text) { _terminal.copy(text); },
+                 [this] {
+                     _terminal.repaint();
+                     needsDisplay();
+                 }},
+                terminal.marks()),
+      _preferences(FilePreferences::userFolder()), _app(applicationSurroundings(settings)) {}
+
+ScreenBrowser::~ScreenBrowser() {
+    _app.applicationWillTerminate();
+}
+
+PallaxApp::Surroundings ScreenBrowser::applicationSurroundings(const Settings& settings) {
+    PallaxApp::Surroundings surroundings{_frontEnd.toolkit(),
+                                         _files,
+                                         _preferences,
+                                         _link.queue(),
+                                         _link.clock(),
+                                         [this](ModelObserver& observer) {
+                                             return std::make_unique<PallaxModel>(
+                                                 _link.modelPlatform(observer));
+                                         }};
+    if (settings.snapshotDirectory) {
+        surroundings.snapshotDirectory = *settings.snapshotDirectory;
+    }
+    if (settings.saveButtonMarker) {
+        surroundings.saveButtonMarker = *settings.saveButtonMarker;
+    }
+    return surroundings;
+}
+
+bool ScreenBrowser::run() {
+    AsioMainQueue& queue = _link.queue();
+    // Behind SIGCONT the terminal may have another extent than before.
+    queue.onSignal({SIGINT, SIGTERM, SIGHUP, SIGWINCH, SIGCONT}, [this](int signal) {
+        if (signal == SIGWINCH || signal == SIGCONT) {
+            adoptSize();
+        } else {
+            _link.queue().stop();
+        }
+    });
+    if (_link.hasChild()) {
+        _link.clock().onEnd([this] { _frontEnd.setNote("End of the recording"); });
+    }
+    _frontEnd.resize(_terminal.columns(), _terminal.rows());
+    _app.applicationDidFinishLaunching();
+    waitForKey();
+    const auto looks = queue.scheduleRepeating(kLookInterval, [this] { look(); });
+    queue.run();
+    return !_childLost;
+}
+
+void ScreenBrowser::waitForKey() {
+    _keys.onceReadable([this] { readKey(); });
+}
+
+/// One key at a time: what it posts to the queue comes before the next one.
+void ScreenBrowser::readKey() {
+    if (const auto key = _terminal.read()) {
+        _frontEnd.handle(*key);
+        _link.queue().async([this] { readKey(); });
+    } else if (_terminal.isHungUp()) {
+        _link.queue().stop();
+    } else {
+        waitForKey();
+    }
+}
+
+void ScreenBrowser::needsDisplay() {
+    if (!_isDisplayPosted) {
+        _isDisplayPosted = true;
+        _link.queue().async([this] { display(); });
+    }
+}
+
+void ScreenBrowser::display() {
+    _terminal.show(_frontEnd.draw());
+    _isDisplayPosted = false; // drawing itself asks for no other drawing
+    keepTurning();
+}
+
+void ScreenBrowser::keepTurning() {
+    if (!_frontEnd.isAnimated()) {
+        _turning.reset();
+    } else if (!_turning) {
+        _turning = _link.queue().scheduleRepeating(kTurnInterval, [this] { _frontEnd.turn(); });
+    }
+}
+
+void ScreenBrowser::adoptSize() {
+    _terminal.adoptSize();
+    _frontEnd.resize(_terminal.columns(), _terminal.rows());
+}
+
+void ScreenBrowser::look() {
+    if (_link.childHasEnded()) {
+        // A signal to the whole process group may be on its way to us too.
+        _link.queue().after(kLookInterval, [this] {
+            _childLost = true;
+            _link.queue().stop();
+        });
+    }
+}
+
+} // namespace pallax

@@ -1,0 +1,55 @@
+#pragma once
+
+#include "app/PallaxApp.h"
+#include "cli/BrowseLink.h"
+#include "cli/DroppedNotices.h"
+#include "host/FilePreferences.h"
+#include "host/HostFileSystem.h"
+#include "ui/terminal/CursesTerminal.h"
+#include "ui/terminal/FrontEnd.h"
+
+#include <memory>
+#include <optional>
+
+namespace pallax {
+
+struct Settings;
+
+/// The application on the terminal that the process runs in.
+class ScreenBrowser {
+public:
+    /// The terminal outlives the browser, so that an error is told on a restored one.
+    ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
+                  const Settings& settings, terminal::CursesTerminal& terminal);
+    /// Whatever ended it: the application terminates as it is to at every exit.
+    ~ScreenBrowser();
+    ScreenBrowser(const ScreenBrowser&) = delete;
+    ScreenBrowser& operator=(const ScreenBrowser&) = delete;
+
+    /// Until the user quits or a signal ends it. False when the child ended before.
+    bool run();
+
+private:
+    PallaxApp::Surroundings applicationSurroundings(const Settings& settings);
+    void waitForKey();
+    void readKey();
+    void needsDisplay();
+    void display();
+    void keepTurning();
+    void adoptSize();
+    void look();
+
+    bool _childLost = false;
+    bool _isDisplayPosted = false;
+    terminal::CursesTerminal& _terminal;
+    DroppedNotices _notices; // the screen is no place for them
+    BrowseLink _link;
+    DescriptorWatch _keys;
+    terminal::FrontEnd _frontEnd;
+    HostFileSystem _files;
+    FilePreferences _preferences;
+    PallaxApp _app;
+    std::unique_ptr<RepeatingTimer> _turning; // while something on the screen turns
+};
+
+} // namespace pallax
