@@ -16,6 +16,14 @@ constexpr std::chrono::milliseconds kLookInterval{500};
 
 } // namespace
 
+bool ScreenBrowser::Files::writePropertyList(const std::string& path, const PropertyList& object) {
+    const bool isWritten = _files.writePropertyList(path, object);
+    if (isWritten) {
+        _frontEnd.setMessage("Saved " + path);
+    }
+    return isWritten;
+}
+
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
                              ChildService* child, const Settings& settings,
                              terminal::CursesTerminal& terminal)
@@ -28,7 +36,8 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                      needsDisplay();
                  }},
                 terminal.marks()),
-      _preferences(FilePreferences::userFolder()), _app(applicationSurroundings(settings)) {}
+      _files(_frontEnd), _preferences(FilePreferences::userFolder()),
+      _app(applicationSurroundings(settings)) {}
 
 ScreenBrowser::~ScreenBrowser() {
     _app.applicationWillTerminate();

@@ -30,6 +30,18 @@ public:
     bool run();
 
 private:
+    /// The machine's files; tells where a snapshot went.
+    class Files final : public FileSystem {
+    public:
+        explicit Files(terminal::FrontEnd& frontEnd) : _frontEnd(frontEnd) {}
+        bool exists(const std::string& path) const override { return _files.exists(path); }
+        bool writePropertyList(const std::string& path, const PropertyList& object) override;
+
+    private:
+        terminal::FrontEnd& _frontEnd;
+        HostFileSystem _files;
+    };
+
     PallaxApp::Surroundings applicationSurroundings(const Settings& settings);
     void waitForKey();
     void readKey();
@@ -46,7 +58,7 @@ private:
     BrowseLink _link;
     DescriptorWatch _keys;
     terminal::FrontEnd _frontEnd;
-    HostFileSystem _files;
+    Files _files;
     FilePreferences _preferences;
     PallaxApp _app;
     std::unique_ptr<RepeatingTimer> _turning; // while something on the screen turns

@@ -3,7 +3,6 @@
 #include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
-#include <string>
 
 namespace pallax::terminal {
 
@@ -36,11 +35,15 @@ void drawBox(Grid& grid, const Marks& marks, const Box& box, std::string_view ti
     }
 }
 
-int drawButton(Grid& grid, int right, int y, std::string_view text, bool hasFocus) {
-    const std::string shown = "[ " + std::string(text) + " ]";
-    const int left = right - columnsOf(shown);
+std::string buttonFace(std::string_view text, bool isNarrow) {
+    const std::string_view blank = isNarrow ? "" : " ";
+    return std::string("[").append(blank).append(text).append(blank).append("]");
+}
+
+int drawButton(Grid& grid, int right, int y, std::string_view face, bool hasFocus) {
+    const int left = right - columnsOf(face);
     // Bold and underlined too, so that the focus is seen where there are no colours.
-    grid.put(left, y, shown, {.bold = hasFocus, .underline = hasFocus, .accent = hasFocus});
+    grid.put(left, y, face, {.bold = hasFocus, .underline = hasFocus, .accent = hasFocus});
     return left;
 }
 

@@ -3,6 +3,7 @@
 #include "ui/terminal/Grid.h"
 #include "ui/terminal/Marks.h"
 
+#include <string>
 #include <string_view>
 
 namespace pallax::terminal {
@@ -24,7 +25,10 @@ Box centeredBox(const Grid& grid, int columns, int rows);
 /// Blanks the box and draws its frame, with the title in the upper edge.
 void drawBox(Grid& grid, const Marks& marks, const Box& box, std::string_view title);
 
-/// Draws "[ Text ]" ending before column `right`; where it begins is returned.
-int drawButton(Grid& grid, int right, int y, std::string_view text, bool hasFocus);
+/// A button's face: "[ Text ]", or "[Text]" where room is scarce.
+std::string buttonFace(std::string_view text, bool isNarrow = false);
+
+/// Draws a button ending before column `right`; where it begins is returned.
+int drawButton(Grid& grid, int right, int y, std::string_view face, bool hasFocus);
 
 } // namespace pallax::terminal

@@ -47,6 +47,11 @@ Grid FrontEnd::draw() {
     return grid;
 }
 
+void FrontEnd::setMessage(std::string message) {
+    _message = std::move(message);
+    needsDisplay();
+}
+
 void FrontEnd::setNote(std::string note) {
     _note = std::move(note);
     needsDisplay();
@@ -295,8 +300,7 @@ void FrontEnd::save() {
         return std::holds_alternative<ui::SaveButton>(item);
     });
     if (button == items.end()) {
-        _message = "Saving is not enabled here";
-        return needsDisplay();
+        return setMessage("Saving is not enabled here");
     }
     const auto action = std::get<ui::SaveButton>(*button).action; // the items may be replaced
     action();
@@ -307,8 +311,7 @@ void FrontEnd::copyValue(TerminalTable& table) {
         const ui::RowText text = table.source().textOfRow(*row);
         const std::string copied = text.value.value_or(text.name);
         _surroundings.copy(copied);
-        _message = "Copied: " + copied;
-        needsDisplay();
+        setMessage("Copied: " + copied);
     }
 }
 

@@ -35,6 +35,8 @@ public:
     void handle(const KeyEvent& event);
     Grid draw();
 
+    /// What has just happened, in the status text's place until the next key.
+    void setMessage(std::string message);
     /// A few words behind the status text, from now on.
     void setNote(std::string note);
 

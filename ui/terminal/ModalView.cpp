@@ -14,6 +14,8 @@ namespace {
 constexpr std::string_view kTitle = "Save snapshot";
 constexpr std::string_view kFieldName = "Description";
 constexpr int kWidth = 76;
+/// Where less than this is inside the frame, names and buttons are shortened.
+constexpr int kNarrow = 28;
 constexpr int kFrameRows = 2;
 constexpr int kFieldAndButtons = 2;
 constexpr int kBlankRows = 2; // above and below the field, where there is room
@@ -60,8 +62,13 @@ void ModalView::drawList(ui::ModalScreen& screen, const Box& box, int rows) {
 void ModalView::drawField(ui::ModalScreen& screen, const Box& box, int y) {
     TerminalTextField& field = terminalTextField(screen.field());
     const Span inside = box.inside();
-    const int nameEnd = _grid.put(inside.left, y, kFieldName, {.bold = true}, inside);
-    const Span room{std::min(nameEnd + 2, inside.right - 1), inside.right};
+    const bool isNarrow = inside.right - inside.left < kNarrow;
+    Span room = inside;
+    if (!isNarrow) {
+        room.left = _grid.put(inside.left, y, kFieldName, {.bold = true}, inside) + 2;
+    } else if (field.editor().text().empty()) {
+        _grid.put(inside.left, y, kFieldName, {.dim = true}, inside);
+    }
     const std::string& text = field.editor().text();
     const int cursor = columnsOf(std::string_view(text).substr(0, field.editor().cursor()));
     const int offset = std::max(room.left + cursor - (room.right - 1), 0);
@@ -74,13 +81,17 @@ void ModalView::drawField(ui::ModalScreen& screen, const Box& box, int y) {
 
 void ModalView::drawButtons(ui::ModalScreen& screen, const Box& box, int y, ModalFocus focus) {
     const bool fieldHasKeys = terminalTextField(screen.field()).isEditing();
-    const int right = box.inside().right;
+    const Span inside = box.inside();
+    const bool isNarrow = inside.right - inside.left < kNarrow;
+    const auto button = [&](int right, std::string_view text, ModalFocus own, auto press) {
+        const bool hasFocus = !fieldHasKeys && focus == own;
+        const int left = drawButton(_grid, right, y, buttonFace(text, isNarrow), hasFocus);
+        _hits.add(left, y, right - left, 1, press);
+        return left;
+    };
     const int cancel =
-        drawButton(_grid, right, y, "Cancel", !fieldHasKeys && focus == ModalFocus::Cancel);
-    _hits.add(cancel, y, right - cancel, 1, [&screen] { screen.cancelPressed(); });
-    const int save =
-        drawButton(_grid, cancel - 1, y, "Save", !fieldHasKeys && focus == ModalFocus::Save);
-    _hits.add(save, y, cancel - 1 - save, 1, [&screen] { screen.savePressed(); });
+        button(inside.right, "Cancel", ModalFocus::Cancel, [&screen] { screen.cancelPressed(); });
+    button(cancel - 1, "Save", ModalFocus::Save, [&screen] { screen.savePressed(); });
 }
 
 } // namespace pallax::terminal

@@ -15,14 +15,14 @@ constexpr int kFrameRows = 2;
 } // namespace
 
 void drawAlert(Grid& grid, const Marks& marks, const ui::Alert& alert) {
-    constexpr int kButtonColumns = 4; // "[ " and " ]"
     constexpr int kAir = 2;
-    const int columns = std::max({columnsOf(alert.title), columnsOf(alert.message) + kAir,
-                                  columnsOf(alert.button) + kButtonColumns});
+    const std::string button = buttonFace(alert.button);
+    const int columns =
+        std::max({columnsOf(alert.title), columnsOf(alert.message) + kAir, columnsOf(button)});
     const Box box = centeredBox(grid, columns + kFrameColumns, 2 + kFrameRows);
     drawBox(grid, marks, box, alert.title);
     grid.put(box.inside().left, box.y + 1, alert.message, {}, box.inside());
-    drawButton(grid, box.inside().right, box.y + 2, alert.button, true);
+    drawButton(grid, box.inside().right, box.y + 2, button, true);
 }
 
 const std::vector<std::string_view>& helpLines() {
@@ -65,9 +65,17 @@ int drawHelp(Grid& grid, const Marks& marks, int first) {
 }
 
 void drawTooSmall(Grid& grid) {
-    const std::string text =
-        "Pallax needs " + std::to_string(kLeastColumns) + "x" + std::to_string(kLeastRows);
-    grid.put(0, 0, text);
+    const std::string need = std::to_string(kLeastColumns) + "x" + std::to_string(kLeastRows);
+    constexpr std::string_view kNeeds = "Pallax needs";
+    const bool fitsInOneRow = grid.columns() > columnsOf(kNeeds) + columnsOf(need);
+    if (fitsInOneRow) {
+        grid.put(0, 0, std::string(kNeeds) + " " + need);
+    } else if (grid.rows() > 1) {
+        grid.put(0, 0, kNeeds);
+        grid.put(0, 1, need);
+    } else {
+        grid.put(0, 0, need);
+    }
 }
 
 } // namespace pallax::terminal
