@@ -40,16 +40,6 @@ std::string contentOf(const std::string& path) {
     return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
 }
 
-std::vector<char*> pointersTo(std::vector<std::string>& texts) {
-    std::vector<char*> pointers;
-    pointers.reserve(texts.size() + 1);
-    for (std::string& text : texts) {
-        pointers.push_back(text.data());
-    }
-    pointers.push_back(nullptr);
-    return pointers;
-}
-
 } // namespace
 
 World::World() {
@@ -74,6 +64,23 @@ std::vector<std::string> World::sockets() const {
     return names;
 }
 
+std::vector<char*> pointersTo(std::vector<std::string>& texts) {
+    std::vector<char*> pointers;
+    pointers.reserve(texts.size() + 1);
+    for (std::string& text : texts) {
+        pointers.push_back(text.data());
+    }
+    pointers.push_back(nullptr);
+    return pointers;
+}
+
+std::vector<std::string> programEnvironment(const World& world) {
+    std::vector<std::string> environment{"XDG_RUNTIME_DIR=" + world.folder().string(),
+                                         "XDG_CONFIG_HOME=" + world.path("config"), "TZ=UTC"};
+    environment.insert(environment.end(), world.environment.begin(), world.environment.end());
+    return environment;
+}
+
 bool eventually(const std::function<bool()>& condition) {
     return within(seconds(10), condition);
 }
@@ -91,9 +98,7 @@ PallaxProcess::PallaxProcess(const World& world, const std::vector<std::string>&
 
     std::vector<std::string> words{PALLAX_PROGRAM};
     words.insert(words.end(), arguments.begin(), arguments.end());
-    std::vector<std::string> environment{"XDG_RUNTIME_DIR=" + world.folder().string(),
-                                         "XDG_CONFIG_HOME=" + world.path("config"), "TZ=UTC"};
-    environment.insert(environment.end(), world.environment.begin(), world.environment.end());
+    std::vector<std::string> environment = programEnvironment(world);
     posix_spawn_file_actions_t files;
     ::posix_spawn_file_actions_init(&files);
     ::posix_spawn_file_actions_addopen(&files, STDIN_FILENO, input.c_str(), O_RDONLY, 0);

@@ -31,6 +31,12 @@ private:
     std::filesystem::path _folder;
 };
 
+/// What a program in the world sees of the environment: its folders, UTC, and the world's own.
+std::vector<std::string> programEnvironment(const World& world);
+
+/// The texts as exec takes them; valid as long as they are.
+std::vector<char*> pointersTo(std::vector<std::string>& texts);
+
 /// True once `condition` holds; false when it does not within ten seconds.
 bool eventually(const std::function<bool()>& condition);
 
