@@ -4,6 +4,8 @@
 #include "tests/doubles/RuntimeFolder.h"
 
 #include <csignal>
+#include <cstdlib>
+#include <fcntl.h>
 #include <filesystem>
 #include <fstream>
 
@@ -223,6 +225,21 @@ TEST_F(EndToEndScreen, ItIsSuspendedAndComesBack) {
     EXPECT_TRUE(terminal.shows("$"));
     terminal.type("exit\r");
     EXPECT_EQ(terminal.wait(), 0);
+}
+
+TEST_F(EndToEndScreen, TheShellsTerminalStaysBlocking) {
+    const std::string command = std::string(PALLAX_PROGRAM) + " " + brief() +
+                                " --speed max; "
+                                "sed -n 's/^flags:/flags/p' /proc/self/fdinfo/0";
+    PallaxTerminal terminal(world, {"-c", command}, {.program = "/bin/sh"});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    terminal.type("q");
+    EXPECT_EQ(terminal.wait(), 0);
+    const std::string screen = terminal.screen().text();
+    const std::size_t at = screen.find("flags");
+    ASSERT_NE(at, std::string::npos) << screen;
+    const long flags = std::strtol(screen.c_str() + at + 5, nullptr, 8);
+    EXPECT_EQ(flags & O_NONBLOCK, 0) << screen;
 }
 
 TEST_F(EndToEndScreen, EverySignalThatEndsItLeavesTheTerminalRestoredAndThePreferenceWritten) {

@@ -23,6 +23,10 @@ namespace {
 
 constexpr short kAccentPair = 1;
 
+/// Opened anew for the keys, even where it is standard input: whoever waits for the descriptor may
+/// make it non-blocking, which is to stay unseen by those who share standard input with us.
+constexpr const char* kControllingTerminal = "/dev/tty";
+
 struct FileCloser {
     void operator()(std::FILE* file) const { (void)std::fclose(file); }
 };
@@ -69,7 +73,7 @@ std::array<wchar_t, CCHARW_MAX + 1> wideText(std::string_view text, bool asciiOn
 } // namespace
 
 struct CursesTerminal::Impl {
-    OwnedFile input; // null where it is standard input
+    OwnedFile input;
     SCREEN* screen = nullptr;
     bool hasAccentColor = false;
     bool isUtf8 = false;
@@ -104,15 +108,12 @@ CursesTerminal::open(const Options& options) {
     (void)std::setlocale(LC_CTYPE, ""); // numbers stay as the C locale writes them
     auto impl = std::make_unique<Impl>();
     impl->isUtf8 = isUtf8Locale();
-    if (::isatty(STDIN_FILENO) == 0) {
-        impl->input.reset(std::fopen("/dev/tty", "re"));
-        if (!impl->input) {
-            return TerminalError{"There is no terminal to take keys from; --print does without."};
-        }
+    impl->input.reset(std::fopen(kControllingTerminal, "re"));
+    if (!impl->input) {
+        return TerminalError{"There is no terminal to take keys from; --print does without."};
     }
     impl->restorer = std::make_unique<TerminalRestorer>(STDOUT_FILENO);
-    std::FILE* input = impl->input ? impl->input.get() : stdin;
-    impl->screen = ::newterm(nullptr, stdout, input);
+    impl->screen = ::newterm(nullptr, stdout, impl->input.get());
     if (impl->screen == nullptr) {
         const char* type = std::getenv("TERM");
         return TerminalError{"Nothing is known here of the terminal type \"" +
@@ -158,7 +159,7 @@ const Marks& CursesTerminal::marks() const {
 }
 
 int CursesTerminal::inputDescriptor() const {
-    return _impl->input ? ::fileno(_impl->input.get()) : STDIN_FILENO;
+    return ::fileno(_impl->input.get());
 }
 
 void CursesTerminal::adoptSize() {

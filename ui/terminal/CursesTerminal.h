@@ -28,8 +28,7 @@ public:
         bool mouse = true;
     };
 
-    /// Keys come from standard input, or from the controlling terminal where standard input is
-    /// something else.
+    /// Keys come from the controlling terminal, so standard input may be something else.
     static Result<std::unique_ptr<CursesTerminal>, TerminalError> open(const Options& options);
     /// Whether this process may draw at all: standard output is a terminal that can be drawn on.
     static bool isPossible();
