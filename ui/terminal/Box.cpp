@@ -31,7 +31,9 @@ void drawBox(Grid& grid, const Marks& marks, const Box& box, std::string_view ti
     grid.put(right, bottom, marks.bottomRight);
     if (!title.empty()) {
         const Span edge{box.x + 1, right};
-        grid.put(box.x + 1, box.y, " " + std::string(title) + " ", {.bold = true}, edge);
+        const int start = grid.put(box.x + 1, box.y, " ", {}, edge);
+        const int end = grid.put(start, box.y, title, {.bold = true}, edge);
+        grid.put(end, box.y, " ", {}, edge);
     }
 }
 
