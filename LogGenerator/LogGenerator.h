@@ -77,6 +77,8 @@ protected:
         : _environment(environment) {}
 
     const GeneratorEnvironment& environment() const { return _environment; }
+    /// The entries of the state's history, in an array of their own; none without one.
+    static Array historyOf(const Dictionary& state);
 
 private:
     GeneratorEnvironment _environment;
