@@ -59,6 +59,12 @@ void LogGenerator::updateHistoryInState(Dictionary& state, const Clock& clock) {
     history->emplace_back(historyEntry(state, clock));
 }
 
+Array LogGenerator::historyOf(const Dictionary& state) {
+    const PropertyList* found = state.find("History");
+    const ArrayRef history = found != nullptr ? found->array() : nullptr;
+    return history != nullptr ? *history : Array();
+}
+
 std::unique_ptr<LogGenerator>
 LogGenerator::generatorFromTechnology(const PropertyList& technology,
                                       std::span<const Technology> technologies,

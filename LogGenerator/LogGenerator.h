@@ -33,8 +33,8 @@ struct Technology {
 /// dictionary and a save record, always working on the state dictionary that the model owns.
 ///
 /// The state's keys: "Template" (the display template as loaded), "Display" (the live display),
-/// "ExtraInfo", "DisplayState" (data: what was received since the previous display generation)
-/// and "History" (array of at most 5 entries, oldest first).
+/// "ExtraInfo", "DisplayState" (data: what was received since the previous display generation; of
+/// an object stream the latest object) and "History" (array of at most 5 entries, oldest first).
 class LogGenerator {
 public:
     static constexpr std::size_t kHistoryLength = 5;
@@ -77,6 +77,8 @@ protected:
         : _environment(environment) {}
 
     const GeneratorEnvironment& environment() const { return _environment; }
+    /// The entries of the state's history, in an array of their own; none without one.
+    static Array historyOf(const Dictionary& state);
 
 private:
     GeneratorEnvironment _environment;

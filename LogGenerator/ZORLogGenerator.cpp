@@ -18,13 +18,6 @@ DlfTime dlfTimeOf(const Clock& clock) {
             static_cast<std::uint8_t>(zone.daylightSaving ? 1 : 0)};
 }
 
-/// The entries of the state's history; none without one.
-Array historyOf(const Dictionary& state) {
-    const PropertyList* found = state.find("History");
-    const ArrayRef history = found != nullptr ? found->array() : nullptr;
-    return history != nullptr ? *history : Array();
-}
-
 } // namespace
 
 std::optional<ByteBuffer> dlfHeader(std::size_t size, const GeneratorEnvironment& environment) {

@@ -95,16 +95,10 @@ std::optional<std::string> refusalOf(const std::string& path) {
         return std::nullopt;
     }
     const Recording::OpenResult recording = Recording::open(path);
-    if (!recording || (*recording)->technology() == nullptr) {
-        return std::nullopt; // the child service has the sentence for it
+    if (!recording) {
+        return std::nullopt; // the child service has the sentence, as for a foreign link type
     }
-    const std::string_view identifier = (*recording)->technology()->identifier;
-    for (const Technology& technology : technologies()) {
-        if (technology.identifier == identifier) {
-            return std::nullopt;
-        }
-    }
-    return noGeneratorSentence((*recording)->name(), identifier);
+    return missingGenerator(**recording, technologies());
 }
 
 ExitStatus browseWithLog(const Request& request) {

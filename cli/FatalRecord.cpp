@@ -17,8 +17,8 @@ std::optional<LogCode> logCodeOf(Bytes message) {
 
 std::string fatalRecordSentence(std::uint64_t packet, Bytes message, std::string_view reason) {
     const auto code = logCodeOf(message);
-    const std::string where = code ? formatText(" (log code 0x%04X)", {*code}) : "";
-    return formatText("packet %llu%@: %@", {packet, where, reason});
+    const std::string where = code ? formatText("log code 0x%04X", {*code}) : "no log code";
+    return formatText("packet %llu (%@): %@", {packet, where, reason});
 }
 
 MessagePorts::Local GuardedMessagePorts::createLocal(std::string_view name,

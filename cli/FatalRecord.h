@@ -21,7 +21,8 @@ enum class OnFatalRecord {
 /// The effective log code of a message; nothing when it is no log record.
 std::optional<LogCode> logCodeOf(Bytes message);
 
-/// "packet 17 (log code 0xFF0000): SIM file data unreadable". Packets are counted from 1.
+/// "packet 17 (log code 0xFF0000): SIM file data unreadable", or "packet 17 (no log code): …" for
+/// what is no log record. Packets are counted from 1.
 std::string fatalRecordSentence(std::uint64_t packet, Bytes message, std::string_view reason);
 
 /// A record has ended the program; the text is the sentence.

@@ -1,6 +1,10 @@
 #pragma once
 
+#include "LogGenerator/LogGenerator.h"
+#include "host/Recording.h"
+
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 
@@ -11,5 +15,9 @@ namespace pallax {
 std::optional<std::string> missingTemplates();
 
 std::string noGeneratorSentence(std::string_view recording, std::string_view technology);
+
+/// Nothing when one of `technologies` is that of the recording, or when its link type tells none.
+std::optional<std::string> missingGenerator(const Recording& recording,
+                                            std::span<const Technology> technologies);
 
 } // namespace pallax

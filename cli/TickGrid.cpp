@@ -2,29 +2,11 @@
 
 namespace pallax {
 
-namespace {
-
-constexpr auto kIntervalCount = static_cast<std::uint64_t>(TickGrid::kInterval.count());
-
-std::uint64_t bits(Time time) {
-    return static_cast<std::uint64_t>(time.time_since_epoch().count());
-}
-
-/// The distance of two times that a signed number may be too small for; `to` is not earlier.
-std::uint64_t nanosecondsBetween(Time from, Time to) {
-    return bits(to) - bits(from);
-}
-
-} // namespace
-
 std::optional<TickGrid::Tick> TickGrid::passedBefore(Time packet) {
-    if (!_first) {
-        _first = packet;
+    if (!_grid) {
+        _grid.emplace(packet, kInterval);
     }
-    if (packet <= *_first) {
-        return std::nullopt;
-    }
-    const std::uint64_t passed = nanosecondsBetween(*_first, packet) / kIntervalCount;
+    const std::uint64_t passed = _grid->passedAt(packet);
     if (passed <= _passed) {
         return std::nullopt;
     }
@@ -35,10 +17,7 @@ std::optional<TickGrid::Tick> TickGrid::passedBefore(Time packet) {
 
 TickGrid::Tick TickGrid::next() const {
     const std::uint64_t number = _passed + 1;
-    const Time first = _first.value_or(Time());
-    const bool beyond = number > nanosecondsBetween(first, Time::max()) / kIntervalCount;
-    const auto time = static_cast<std::int64_t>(bits(first) + number * kIntervalCount);
-    return {number, beyond ? Time::max() : Time(std::chrono::nanoseconds(time))};
+    return {number, _grid->moment(number)};
 }
 
 } // namespace pallax

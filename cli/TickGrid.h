@@ -1,7 +1,7 @@
 #pragma once
 
 #include "monitor/PallaxModel.h"
-#include "platform/Date.h"
+#include "platform/TimeGrid.h"
 
 #include <chrono>
 #include <cstdint>
@@ -9,8 +9,8 @@
 
 namespace pallax {
 
-/// The display ticks of a recording: tick n (from 1) stands n intervals after the first packet.
-/// All is reckoned, nothing is stepped: a gap of years costs as much as one of seconds.
+/// The display ticks of a recording: tick n (from 1) stands n intervals after the first packet. A
+/// gap of years costs as much as one of seconds.
 class TickGrid {
 public:
     static constexpr std::chrono::nanoseconds kInterval = PallaxModel::kDisplayInterval;
@@ -29,7 +29,7 @@ public:
     Tick next() const;
 
 private:
-    std::optional<Time> _first;
+    std::optional<TimeGrid> _grid; ///< from the first packet on
     std::uint64_t _passed = 0;
 };
 

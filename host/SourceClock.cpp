@@ -1,5 +1,7 @@
 #include "host/SourceClock.h"
 
+#include "platform/TimeGrid.h"
+
 #include <algorithm>
 #include <utility>
 
@@ -15,10 +17,6 @@ Time bounded(Time time) {
 }
 
 } // namespace
-
-Time nextOnGrid(Time first, Time time, std::chrono::nanoseconds interval) {
-    return time + (interval - (time - first) % interval);
-}
 
 struct SourceClock::TimerState {
     std::chrono::nanoseconds interval;
@@ -69,7 +67,7 @@ std::unique_ptr<RepeatingTimer> SourceClock::scheduleRepeating(std::chrono::nano
     state->interval = std::max(interval, std::chrono::nanoseconds(1));
     state->action = std::move(action);
     if (_first) {
-        state->due = nextOnGrid(*_first, *_now, state->interval);
+        state->due = TimeGrid(*_first, state->interval).nextAfter(*_now);
     }
     state->wallTimer =
         _wallTimers.scheduleRepeating(interval, [this, weak = std::weak_ptr<TimerState>(state)] {
@@ -95,7 +93,7 @@ bool SourceClock::advance(Time sourceTime) {
         _now = time;
         for (const auto& timer : _timers) {
             const auto state = timer.lock();
-            state->due = nextOnGrid(time, time, state->interval);
+            state->due = TimeGrid(time, state->interval).nextAfter(time);
         }
         return false;
     }
@@ -111,7 +109,7 @@ bool SourceClock::advance(Time sourceTime) {
         return false;
     }
     _now = std::max(*_now, *earliest->due);
-    earliest->due = nextOnGrid(*_first, time, earliest->interval);
+    earliest->due = TimeGrid(*_first, earliest->interval).nextAfter(time);
     earliest->action();
     return true;
 }

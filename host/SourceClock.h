@@ -68,8 +68,4 @@ private:
     std::list<std::weak_ptr<TimerState>> _timers; ///< in the order of their scheduling
 };
 
-/// The first moment after `time` on the grid of `first` and whole intervals. `interval` is
-/// positive, and `first` is not after `time`.
-Time nextOnGrid(Time first, Time time, std::chrono::nanoseconds interval);
-
 } // namespace pallax

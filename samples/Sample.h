@@ -8,7 +8,7 @@
 
 namespace pallax {
 
-/// One packet of a sample recording, transport prefix included.
+/// One packet of a sample recording, exactly as the log channel delivers it.
 struct SamplePacket {
     Time time;
     ByteBuffer data;
@@ -39,5 +39,9 @@ std::vector<SamplePacket> lteDrivePackets();
 /// Two minutes of a UTRAN phone in a car: a data session on its own channel that ends over the
 /// shared and the paging states, two cell changes, neighbours that come and go.
 std::vector<SamplePacket> utranDrivePackets();
+
+/// Half a minute of an IFX phone on foot: a cell change, a call with a handover, neighbours; a
+/// picture every second, as XML, binary and text in turns.
+std::vector<SamplePacket> ifxStreamPackets();
 
 } // namespace pallax

@@ -13,6 +13,7 @@ std::span<const Sample> samples() {
         {"umts-drive.pcap", "gsm", umtsDrivePackets},
         {"lte-drive.pcap", "lte", lteDrivePackets},
         {"utran-drive.pcap", "utran", utranDrivePackets},
+        {"ifx-stream.pcap", "ifx", ifxStreamPackets},
     });
     return kSamples;
 }

@@ -1,7 +1,7 @@
 #include "telephony/PacketPlayer.h"
 
-#include "host/SourceClock.h"
 #include "platform/MainQueue.h"
+#include "platform/TimeGrid.h"
 #include "telephony/PacketSink.h"
 
 #include <algorithm>
@@ -172,7 +172,7 @@ std::chrono::nanoseconds PacketPlayer::wallDelayUntil(Time time) const {
 
 /// The first display tick after the last packet.
 Time PacketPlayer::nextTick() const {
-    return nextOnGrid(*_first, _last, _setup.options.displayInterval);
+    return TimeGrid(*_first, _setup.options.displayInterval).nextAfter(_last);
 }
 
 std::function<void()> PacketPlayer::guarded(void (PacketPlayer::*member)()) {

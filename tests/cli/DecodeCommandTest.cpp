@@ -144,7 +144,7 @@ TEST_F(DecodeCommandTest, ARecordThatThrowsIsReportedAndSkipped) {
     add("a.pcap",
         {{milliseconds(0), "A=1"}, {milliseconds(1), "!a bad list"}, {milliseconds(2), "A=3"}});
     EXPECT_EQ(run(), kExitSuccess);
-    EXPECT_EQ(reports, std::vector<std::string>{"a.pcap: packet 2: a bad list"});
+    EXPECT_EQ(reports, std::vector<std::string>{"a.pcap: packet 2 (no log code): a bad list"});
     EXPECT_EQ(written,
               R"({"packet":1,"time":"2023-11-14T22:13:20.000Z","display":{"Cell":{"A":"1"}}})"
               "\n"
@@ -167,7 +167,7 @@ TEST_F(DecodeCommandTest, StrictStopsAtARecordThatThrows) {
     add("a.pcap", {{milliseconds(0), "A=1"}, {milliseconds(1), "!bad"}, {milliseconds(2), "A=3"}});
     add("b.pcap", {{milliseconds(0), "B=1"}});
     EXPECT_EQ(run(), kExitFatalRecord);
-    EXPECT_EQ(reports, std::vector<std::string>{"a.pcap: packet 2: bad"});
+    EXPECT_EQ(reports, std::vector<std::string>{"a.pcap: packet 2 (no log code): bad"});
     EXPECT_EQ(written,
               R"({"packet":1,"time":"2023-11-14T22:13:20.000Z","display":{"Cell":{"A":"1"}}})"
               "\n");

@@ -40,17 +40,5 @@ TEST_F(EndToEndInstallation, WithoutDisplayTemplatesThereIsNothingToShow) {
     }
 }
 
-TEST_F(EndToEndInstallation, ATechnologyWithoutAGeneratorEndsBrowsingAndDecodingAlike) {
-    constexpr int kIfxLinkType = 147;
-    const std::string recording =
-        record("a.pcap", {{milliseconds(0), registration(0)}}, kIfxLinkType);
-    for (const Run& failed : {run({"decode", recording}), run({recording, "--print"})}) {
-        EXPECT_EQ(failed.status, 1);
-        EXPECT_EQ(failed.out, "");
-        EXPECT_EQ(failed.err,
-                  "pallax: " + recording + ": there is no log generator for the technology IFX.\n");
-    }
-}
-
 } // namespace
 } // namespace pallax

@@ -33,7 +33,7 @@ TEST(FatalRecord, WhatIsNoLogRecordHasNoLogCode) {
     const ByteBuffer object(text.begin(), text.end());
     EXPECT_EQ(logCodeOf(object), std::nullopt);
     EXPECT_EQ(fatalRecordSentence(3, object, "Could not deserialize the object"),
-              "packet 3: Could not deserialize the object");
+              "packet 3 (no log code): Could not deserialize the object");
 }
 
 class GuardedMessagePortsTest : public testing::Test {

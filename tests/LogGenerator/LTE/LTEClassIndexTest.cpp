@@ -1,14 +1,12 @@
 #include "LogGenerator/LTE/LTEClassIndex.h"
 
-#include "tests/doubles/FakeStandardOutput.h"
-#include "tests/doubles/TemplateCheck.h"
+#include "tests/doubles/ClassIndexFixture.h"
 
 #include <gtest/gtest.h>
 
 namespace pallax {
 namespace {
 
-using doubles::FakeStandardOutput;
 using Names = std::vector<std::string>;
 
 /// Who gets the packets of a log code, in call order.
@@ -26,42 +24,14 @@ const std::map<LogCode, Names> kSubscribers = {
     {0xFF0002, {"PDP Context Info"}},
 };
 
-class LTEClassIndexTest : public testing::Test {
-protected:
-    Names subscribersOf(LogCode logCode) const {
-        Names names;
-        for (const Base* record : *_index.getSubscribers(logCode)) {
-            names.emplace_back(record->getSectionName());
-        }
-        return names;
-    }
+class LTEClassIndexTest : public doubles::ClassIndexFixture<LTEClassIndex> {};
 
-    FakeStandardOutput _output;
-    LTEClassIndex _index{_output};
-};
-
-TEST_F(LTEClassIndexTest, SubscribersInCallOrder) {
-    for (const auto& [logCode, names] : kSubscribers) {
-        ASSERT_NE(_index.getSubscribers(logCode), nullptr) << std::hex << logCode;
-        EXPECT_EQ(subscribersOf(logCode), names) << std::hex << logCode;
-    }
-}
-
-TEST_F(LTEClassIndexTest, ItWantsExactlyTheCodesOfItsRecords) {
-    std::vector<std::string> codes;
-    for (const auto& [logCode, names] : kSubscribers) {
-        codes.push_back(std::to_string(logCode));
-    }
-    EXPECT_EQ(_index.getAllLogCodes(), codes);
-    EXPECT_EQ(_index.getSubscribers(0xB0C3), nullptr);
+TEST_F(LTEClassIndexTest, SubscribersInCallOrderAndExactlyTheCodesOfItsRecords) {
+    expectSubscribers(kSubscribers, 0xB0C3);
 }
 
 TEST_F(LTEClassIndexTest, ItHoldsElevenSections) {
-    Names sections;
-    for (const auto& [name, record] : _index.classes()) {
-        sections.push_back(name);
-    }
-    EXPECT_EQ(sections,
+    EXPECT_EQ(sections(),
               (Names{"Connected mode LTE Intra-frequency Measurement", "Detected Cells",
                      "Measured Neighbor Cells", "Neighbor Cells List", "Neighbor Measurements",
                      "PDP Context Info", "Reselection Candidates", "Reselection Candidates List",
@@ -69,14 +39,15 @@ TEST_F(LTEClassIndexTest, ItHoldsElevenSections) {
 }
 
 TEST_F(LTEClassIndexTest, TemplateAndRecordsMatchBothWays) {
-    doubles::expectTemplateMatches(
-        doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/LTE.plist"), _index);
+    expectTemplateMatches("LTE.plist");
 }
 
-TEST(LTEClassIndex, ItsEndIsPrintedBeforeThatOfItsBase) {
-    FakeStandardOutput output;
-    { const LTEClassIndex index(output); }
-    EXPECT_EQ(output.lines, (Names{"Deallocing LTEClassIndex", "Deallocing ClassIndex"}));
+TEST_F(LTEClassIndexTest, ItsRecordsRegisterInTheirOrder) {
+    expectRegistration({3, 1, 1, 1, 1, 1, 1, 1, 1, 1, 1});
+}
+
+TEST_F(LTEClassIndexTest, ItsEndIsPrintedBeforeThatOfItsBase) {
+    EXPECT_EQ(lastLines(), (Names{"Deallocing LTEClassIndex", "Deallocing ClassIndex"}));
 }
 
 } // namespace

@@ -1,16 +1,12 @@
 #include "LogGenerator/UTRAN/UTRANClassIndex.h"
 
-#include "tests/doubles/FakeStandardOutput.h"
-#include "tests/doubles/RecordingLog.h"
-#include "tests/doubles/TemplateCheck.h"
+#include "tests/doubles/ClassIndexFixture.h"
 
 #include <gtest/gtest.h>
 
 namespace pallax {
 namespace {
 
-using doubles::FakeStandardOutput;
-using doubles::RecordingLog;
 using Names = std::vector<std::string>;
 
 /// Who gets the packets of a log code, in call order.
@@ -21,34 +17,10 @@ const std::map<LogCode, Names> kSubscribers = {
     {0xFF0001, {"Serving Cell Info"}},    {0xFF0002, {"PDP Context Info"}},
 };
 
-class UTRANClassIndexTest : public testing::Test {
-protected:
-    Names subscribersOf(LogCode logCode) const {
-        Names names;
-        for (const Base* record : *_index.getSubscribers(logCode)) {
-            names.emplace_back(record->getSectionName());
-        }
-        return names;
-    }
+class UTRANClassIndexTest : public doubles::ClassIndexFixture<UTRANClassIndex> {};
 
-    FakeStandardOutput _output;
-    UTRANClassIndex _index{_output};
-};
-
-TEST_F(UTRANClassIndexTest, SubscribersInCallOrder) {
-    for (const auto& [logCode, names] : kSubscribers) {
-        ASSERT_NE(_index.getSubscribers(logCode), nullptr) << std::hex << logCode;
-        EXPECT_EQ(subscribersOf(logCode), names) << std::hex << logCode;
-    }
-}
-
-TEST_F(UTRANClassIndexTest, ItWantsExactlyTheCodesOfItsRecords) {
-    std::vector<std::string> codes;
-    for (const auto& [logCode, names] : kSubscribers) {
-        codes.push_back(std::to_string(logCode));
-    }
-    EXPECT_EQ(_index.getAllLogCodes(), codes);
-    EXPECT_EQ(_index.getSubscribers(0xD00B), nullptr);
+TEST_F(UTRANClassIndexTest, SubscribersInCallOrderAndExactlyTheCodesOfItsRecords) {
+    expectSubscribers(kSubscribers, 0xD00B);
 }
 
 TEST_F(UTRANClassIndexTest, ItHoldsEightSectionsEachOfItsClass) {
@@ -66,24 +38,16 @@ TEST_F(UTRANClassIndexTest, ItHoldsEightSectionsEachOfItsClass) {
 }
 
 TEST_F(UTRANClassIndexTest, TemplateAndRecordsMatchBothWays) {
-    doubles::expectTemplateMatches(
-        doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/UTRAN.plist"), _index);
+    expectTemplateMatches("UTRAN.plist");
 }
 
 // The counts of the codes tell the records apart: only the serving cell has two.
-TEST(UTRANClassIndex, TheRecordsRegisterInTheOrderOfItsFields) {
-    FakeStandardOutput output;
-    RecordingLog log;
-    const UTRANClassIndex index(output);
-    std::vector<RecordingLog::Line> lines(8, {4, "Array Count: 1"});
-    lines[1].text = "Array Count: 2";
-    EXPECT_EQ(log.lines(), lines);
+TEST_F(UTRANClassIndexTest, TheRecordsRegisterInTheOrderOfItsFields) {
+    expectRegistration({1, 2, 1, 1, 1, 1, 1, 1});
 }
 
-TEST(UTRANClassIndex, ItsEndPrintsNoLineOfItsOwn) {
-    FakeStandardOutput output;
-    { const UTRANClassIndex index(output); }
-    EXPECT_EQ(output.lines, (Names{"Deallocing ClassIndex"}));
+TEST_F(UTRANClassIndexTest, ItsEndPrintsNoLineOfItsOwn) {
+    EXPECT_EQ(lastLines(), (Names{"Deallocing ClassIndex"}));
 }
 
 } // namespace

@@ -1,16 +1,12 @@
 #include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
 
-#include "tests/doubles/FakeStandardOutput.h"
-#include "tests/doubles/RecordingLog.h"
-#include "tests/doubles/TemplateCheck.h"
+#include "tests/doubles/ClassIndexFixture.h"
 
 #include <gtest/gtest.h>
 
 namespace pallax {
 namespace {
 
-using doubles::FakeStandardOutput;
-using doubles::RecordingLog;
 using Names = std::vector<std::string>;
 
 /// Who gets the packets of a log code, in call order.
@@ -46,91 +42,53 @@ const std::map<LogCode, Names> kSubscribers = {
     {0xFF0002, {"PDP Context Info"}},
 };
 
-class ZOR_GSMClassIndexTest : public testing::Test {
-protected:
-    Names subscribersOf(LogCode logCode) const {
-        Names names;
-        for (const Base* record : *_index.getSubscribers(logCode)) {
-            names.emplace_back(record->getSectionName());
-        }
-        return names;
-    }
+class ZOR_GSMClassIndexTest : public doubles::ClassIndexFixture<ZOR_GSMClassIndex> {};
 
-    FakeStandardOutput _output;
-    ZOR_GSMClassIndex _index{_output};
-};
-
-TEST_F(ZOR_GSMClassIndexTest, SubscribersInCallOrder) {
-    for (const auto& [logCode, names] : kSubscribers) {
-        ASSERT_NE(_index.getSubscribers(logCode), nullptr) << std::hex << logCode;
-        EXPECT_EQ(subscribersOf(logCode), names) << std::hex << logCode;
-    }
-}
-
-TEST_F(ZOR_GSMClassIndexTest, ItWantsExactlyTheCodesOfItsRecords) {
-    std::vector<std::string> codes;
-    for (const auto& [logCode, names] : kSubscribers) {
-        codes.push_back(std::to_string(logCode));
-    }
-    EXPECT_EQ(_index.getAllLogCodes(), codes);
-    EXPECT_EQ(_index.getSubscribers(0x7133), nullptr);
+TEST_F(ZOR_GSMClassIndexTest, SubscribersInCallOrderAndExactlyTheCodesOfItsRecords) {
+    expectSubscribers(kSubscribers, 0x7133);
 }
 
 TEST_F(ZOR_GSMClassIndexTest, ItHolds26Sections) {
-    Names sections;
-    for (const auto& [name, record] : _index.classes()) {
-        sections.push_back(name);
-    }
-    EXPECT_EQ(sections, (Names{"Active Set",
-                               "BLER",
-                               "Cell Change Counters",
-                               "Coding Scheme",
-                               "Detected Set",
-                               "Equivalent PLMN List",
-                               "GPRS Information",
-                               "GSM RR Info",
-                               "GSM Serving Cell",
-                               "GSM Set",
-                               "HSDPA Info",
-                               "Mobile Allocation",
-                               "Monitored Set",
-                               "Neighboring Cells",
-                               "Non-Ranked GSM Set",
-                               "Non-Ranked UMTS Set",
-                               "PDP Context Info",
-                               "Process CO",
-                               "Process CS",
-                               "Process PS",
-                               "SIM Info",
-                               "Serving PLMN",
-                               "UMTS RR Info",
-                               "UMTS RR Measurement",
-                               "UMTS Set",
-                               "Virtual Active Set"}));
+    EXPECT_EQ(sections(), (Names{"Active Set",
+                                 "BLER",
+                                 "Cell Change Counters",
+                                 "Coding Scheme",
+                                 "Detected Set",
+                                 "Equivalent PLMN List",
+                                 "GPRS Information",
+                                 "GSM RR Info",
+                                 "GSM Serving Cell",
+                                 "GSM Set",
+                                 "HSDPA Info",
+                                 "Mobile Allocation",
+                                 "Monitored Set",
+                                 "Neighboring Cells",
+                                 "Non-Ranked GSM Set",
+                                 "Non-Ranked UMTS Set",
+                                 "PDP Context Info",
+                                 "Process CO",
+                                 "Process CS",
+                                 "Process PS",
+                                 "SIM Info",
+                                 "Serving PLMN",
+                                 "UMTS RR Info",
+                                 "UMTS RR Measurement",
+                                 "UMTS Set",
+                                 "Virtual Active Set"}));
 }
 
 TEST_F(ZOR_GSMClassIndexTest, TemplateAndRecordsMatchBothWays) {
-    doubles::expectTemplateMatches(
-        doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"), _index);
+    expectTemplateMatches("ZOR_GSM.plist");
 }
 
-TEST(ZOR_GSMClassIndex, ItsRecordsRegisterInTheirOrder) {
-    FakeStandardOutput output;
-    const RecordingLog log;
-    const ZOR_GSMClassIndex index(output);
-    std::vector<RecordingLog::Line> expected;
-    // How many codes each record wants, from ActiveSet to HSDPAInformation.
-    for (const int count :
-         {1, 0, 7, 4, 1, 3, 1, 2, 0, 0, 1, 1, 0, 2, 3, 2, 1, 4, 1, 0, 2, 5, 1, 1, 1, 1}) {
-        expected.push_back({4, "Array Count: " + std::to_string(count)});
-    }
-    EXPECT_EQ(log.lines(), expected);
+TEST_F(ZOR_GSMClassIndexTest, ItsRecordsRegisterInTheirOrder) {
+    // From ActiveSet to HSDPAInformation.
+    expectRegistration(
+        {1, 0, 7, 4, 1, 3, 1, 2, 0, 0, 1, 1, 0, 2, 3, 2, 1, 4, 1, 0, 2, 5, 1, 1, 1, 1});
 }
 
-TEST(ZOR_GSMClassIndex, ItsEndIsPrintedBeforeThatOfItsBase) {
-    FakeStandardOutput output;
-    { const ZOR_GSMClassIndex index(output); }
-    EXPECT_EQ(output.lines, (Names{"Deallocing ZOR_GSMClassIndex", "Deallocing ClassIndex"}));
+TEST_F(ZOR_GSMClassIndexTest, ItsEndIsPrintedBeforeThatOfItsBase) {
+    EXPECT_EQ(lastLines(), (Names{"Deallocing ZOR_GSMClassIndex", "Deallocing ClassIndex"}));
 }
 
 } // namespace

@@ -1,0 +1,106 @@
+#include "LogGenerator/GSM/GSMLogGenerator.h"
+
+#include "platform/Format.h"
+#include "platform/PropertyListCodec.h"
+
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr int kUnknownTypeLine = 78;
+constexpr int kNotDeserializedLine = 90;
+
+/// The display form of a value inside a container.
+PropertyList collapsedForm(const PropertyList& object) {
+    PropertyList form = GSMLogGenerator::processObject(object);
+    PropertyList single = GSMLogGenerator::canCollapse(form);
+    return single.isNull() ? form : single;
+}
+
+PropertyList displayForm(const Dictionary& entries) {
+    Dictionary display;
+    display.reserve(entries.size());
+    for (const Dictionary::Entry& entry : entries) {
+        if (entry.hasStringKey) {
+            display.set(entry.key, collapsedForm(entry.value));
+        } else {
+            display.appendForeignKey(entry.key, collapsedForm(entry.value));
+        }
+    }
+    return display;
+}
+
+PropertyList displayForm(const Array& elements) {
+    Array display;
+    display.reserve(elements.size());
+    bool isFirst = true;
+    for (const PropertyList& element : elements) {
+        PropertyList form = collapsedForm(element); // of the first as well, for its types
+        if (!isFirst) {
+            display.push_back(std::move(form));
+        }
+        isFirst = false;
+    }
+    return display;
+}
+
+} // namespace
+
+GSMLogGenerator::InternalInconsistencyException::InternalInconsistencyException(
+    const std::string& message, int line)
+    : std::runtime_error(formatText("%@ (%s, line %d)", {message, kFile, line})), _message(message),
+      _line(line) {}
+
+std::unique_ptr<LogGenerator> GSMLogGenerator::generator(const GeneratorEnvironment& environment) {
+    return std::make_unique<GSMLogGenerator>(environment);
+}
+
+void GSMLogGenerator::updateState(Dictionary& state, Bytes data) {
+    const PropertyListResult object = parsePropertyList(data);
+    if (!object) {
+        throw InternalInconsistencyException("Could not deserialize the object",
+                                             kNotDeserializedLine);
+    }
+    PropertyList display = processObject(*object); // before anything is stored, for it may throw
+    state.setFixed("DisplayState", *object);
+    state.setFixed("Display", std::move(display));
+    state.setFixed("ExtraInfo", Dictionary());
+}
+
+PropertyList GSMLogGenerator::generateLogUsingState(Dictionary& state) {
+    updateHistoryInState(state, environment().clock);
+    const PropertyList* display = state.find("Display");
+    return display != nullptr ? *display : PropertyList();
+}
+
+PropertyList GSMLogGenerator::getStartCommand() const {
+    return Dictionary{{"SetState", "Streaming"}};
+}
+
+PropertyList GSMLogGenerator::getSaveContentsFromState(const Dictionary& state) const {
+    return historyOf(state);
+}
+
+PropertyList GSMLogGenerator::processObject(const PropertyList& object) {
+    if (object.isString()) {
+        return object;
+    }
+    if (const DictionaryRef entries = object.dictionary()) {
+        return displayForm(*entries);
+    }
+    if (const ArrayRef elements = object.array()) {
+        return displayForm(*elements);
+    }
+    // A value's class is its property-list type, under the name that every diagnostic gives it.
+    throw InternalInconsistencyException(
+        formatText("Unknown object of type %@ encountered", {object.typeName()}), kUnknownTypeLine);
+}
+
+PropertyList GSMLogGenerator::canCollapse(const PropertyList& object) {
+    const DictionaryRef entries = object.dictionary();
+    return entries != nullptr && entries->size() == 1 ? entries->begin()->value : PropertyList();
+}
+
+} // namespace pallax

@@ -1,0 +1,58 @@
+#pragma once
+
+#include "LogGenerator/LogGenerator.h"
+#include "platform/Text.h"
+
+#include <memory>
+#include <stdexcept>
+#include <string>
+#include <string_view>
+
+namespace pallax {
+
+/// The generator of the IFX modem, whose log channel carries serialized objects: each message is
+/// one property list, in any of the forms, of dictionaries, arrays and strings, and holds the
+/// whole picture. The display is that object, simplified; nothing of an earlier message stays.
+class GSMLogGenerator final : public LogGenerator {
+public:
+    /// A message breaks what this generator counts on. The state is then as it was before the
+    /// message. Nothing in the core catches it.
+    class InternalInconsistencyException : public std::runtime_error {
+    public:
+        static constexpr const char* kFile = "LogGenerator/GSM/GSMLogGenerator";
+
+        /// `line` is the number by which a failure is known; it does not follow the source.
+        InternalInconsistencyException(const std::string& message, int line);
+
+        /// "Could not deserialize the object"; what() has the location behind it.
+        std::string_view message() const { return _message.view(); }
+        const char* file() const { return kFile; }
+        int line() const { return _line; }
+
+    private:
+        Text _message; // copying an exception must not throw
+        int _line;
+    };
+
+    static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment);
+
+    explicit GSMLogGenerator(const GeneratorEnvironment& environment) : LogGenerator(environment) {}
+
+    /// Throws InternalInconsistencyException for what is no property list, an empty message
+    /// included, and for a value of another type than the three anywhere in it.
+    void updateState(Dictionary& state, Bytes data) override;
+    PropertyList generateLogUsingState(Dictionary& state) override;
+    PropertyList getStartCommand() const override;
+    PropertyList getSaveContentsFromState(const Dictionary& state) const override;
+
+    /// The display form: in new containers, at every level below the top, a dictionary of one
+    /// entry gives way to that entry's value, so that chains of them fold completely. The first
+    /// element of every array is left out, though it too must be of the three types. Throws
+    /// InternalInconsistencyException for another one.
+    static PropertyList processObject(const PropertyList& object);
+
+    /// The single value of a dictionary that has exactly one entry; null for anything else.
+    static PropertyList canCollapse(const PropertyList& object);
+};
+
+} // namespace pallax

@@ -1,0 +1,64 @@
+#pragma once
+
+#include "platform/PropertyListCodec.h"
+#include "tests/doubles/TextPropertyList.h"
+
+#include <rapidcheck.h>
+
+#include <string>
+#include <string_view>
+
+/// Messages of the object stream.
+namespace pallax {
+
+inline ByteBuffer bytesOf(std::string_view text) {
+    return {text.begin(), text.end()};
+}
+
+inline ByteBuffer xmlMessage(const PropertyList& object) {
+    return bytesOf(*serializeXml(object));
+}
+
+inline ByteBuffer binaryMessage(const PropertyList& object) {
+    return *serializeBinary(object);
+}
+
+inline ByteBuffer textMessage(const PropertyList& object) {
+    return bytesOf(doubles::textForm(object));
+}
+
+/// Any object of strings and dictionaries, and with `withArrays` of arrays. Small containers
+/// are frequent, for they are what collapses.
+inline PropertyList anyObject(int depth, bool withArrays = true) {
+    constexpr int kMostEntries = 4;
+    const int kind = *rc::gen::inRange(0, depth > 0 ? 6 : 1);
+    if (kind == 0) {
+        return *rc::gen::container<std::string>(rc::gen::inRange(' ', '~'));
+    }
+    const int count = *rc::gen::inRange(0, kMostEntries);
+    if (kind < 3 && withArrays) {
+        Array elements;
+        for (int index = 0; index < count; ++index) {
+            elements.push_back(anyObject(depth - 1, withArrays));
+        }
+        return elements;
+    }
+    Dictionary entries;
+    for (int index = 0; index < count; ++index) {
+        entries.set(Text(std::string(1, static_cast<char>('A' + *rc::gen::inRange(0, 26)))),
+                    anyObject(depth - 1, withArrays));
+    }
+    return entries;
+}
+
+/// The same with the top level a dictionary, as the modem sends it.
+inline PropertyList anyMessage(bool withArrays = true) {
+    constexpr int kDepth = 4;
+    Dictionary entries;
+    for (const char* key : {"Cell", "List", "State"}) {
+        entries.set(key, anyObject(kDepth, withArrays));
+    }
+    return entries;
+}
+
+} // namespace pallax

@@ -1,0 +1,130 @@
+#include "tests/cli/EndToEnd.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <csignal>
+#include <regex>
+#include <sstream>
+
+namespace pallax {
+namespace {
+
+using doubles::eventually;
+using doubles::PallaxProcess;
+using std::chrono::milliseconds;
+using std::chrono::steady_clock;
+
+/// Real processes over the 5 seconds that lie between two tries to connect.
+class EndToEndReconnect : public EndToEnd {
+protected:
+    /// The retry delay, less what it may take to see the line from which it is measured.
+    static constexpr milliseconds kLeastDelay{4700};
+
+    static constexpr const char* kStarted = "<3>Starting the display update timer\n";
+    static constexpr const char* kNoPorts = "<3>Could not create the ports necessary\n";
+
+    /// The arguments of a service that plays one registration state round and round.
+    std::vector<std::string> serviceOf(const std::string& name, unsigned state) const {
+        std::vector<Packet> packets;
+        for (int count = 0; count < 100; ++count) {
+            packets.emplace_back(milliseconds(100) * count, registration(state));
+        }
+        return {"service", "--play", record(name, packets), "--loop", "--speed", "10"};
+    }
+
+    /// When the viewer's log has come to hold a line `count` times.
+    static steady_clock::time_point seen(const PallaxProcess& viewer, const std::string& line,
+                                         int count = 1) {
+        EXPECT_TRUE(eventually([&] { return occurrences(viewer.err(), line) >= count; }))
+            << line << viewer.err();
+        return steady_clock::now();
+    }
+
+    static int occurrences(const std::string& text, const std::string& part) {
+        int count = 0;
+        for (auto at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) {
+            ++count;
+        }
+        return count;
+    }
+
+    static void end(PallaxProcess& process) {
+        process.signal(SIGTERM);
+        EXPECT_EQ(process.wait(), 0);
+    }
+};
+
+/// The lines of a log from the first that contains `text`, addresses replaced.
+std::vector<std::string> linesFrom(const std::string& log, const std::string& text) {
+    std::vector<std::string> lines;
+    std::istringstream stream(log);
+    for (std::string line; std::getline(stream, line);) {
+        if (!lines.empty() || line.find(text) != std::string::npos) {
+            lines.push_back(std::regex_replace(line, std::regex("0x[0-9a-f]+"), "0xADDRESS"));
+        }
+    }
+    return lines;
+}
+
+TEST_F(EndToEndReconnect, AfterAKilledServiceTheViewerTriesAgain5SecondsLaterAndItsDisplayStays) {
+    PallaxProcess service(world, serviceOf("first.pcap", 2));
+    EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
+    PallaxProcess viewer(world, {"--log-level", "3"});
+    EXPECT_TRUE(viewer.says("  MM Service State: REG_STATE_REGISTERING\n"));
+    service.signal(SIGKILL);
+    EXPECT_EQ(service.wait(), -SIGKILL);
+
+    const auto failed = seen(viewer, kNoPorts);
+    EXPECT_TRUE(viewer.says("Connecting...\n"));
+    const std::string before = viewer.out();
+    PallaxProcess again(world, serviceOf("second.pcap", 0));
+    const auto started = seen(viewer, kStarted, 2);
+    EXPECT_GE(started - failed, kLeastDelay);
+    EXPECT_EQ(linesFrom(viewer.err(), "INVALIDATED"),
+              (std::vector<std::string>{
+                  "<3> ***** INVALIDATED 0xADDRESS *****", "<3>Could not create HXServerConnection",
+                  "<3>Could not create the ports necessary",
+                  "<3> ***** Created ports (send=0xADDRESS, recv=0xADDRESS)",
+                  "<3>Creating ZOR_GSMLogGenerator object",
+                  "<3>Creating ZORLogGenerator2 object with 0xADDRESS", "<3>Class Index: 1",
+                  "<3>Got log generated: 0xADDRESS", "<3>Starting the display update timer"}));
+
+    // In between nothing is shown; then the display, which has kept the values of the first.
+    EXPECT_TRUE(eventually([&] {
+        return occurrences(viewer.out(), "\nSIM Info\n") > occurrences(before, "\nSIM Info\n");
+    }));
+    const std::string since = viewer.out().substr(before.size());
+    EXPECT_TRUE(before.ends_with("\nConnecting...\n")) << before;
+    EXPECT_TRUE(since.starts_with("Deallocing ZOR_GSMClassIndex\nDeallocing ClassIndex\n== "))
+        << since;
+    EXPECT_NE(since.find("\n  MM Service State: REG_STATE_REGISTERING\n"), std::string::npos)
+        << since;
+    EXPECT_EQ(since.find("INACTIVE"), std::string::npos) << since;
+    EXPECT_EQ(since.find('*'), std::string::npos) << "nothing has changed\n" << since;
+    end(viewer);
+    end(again);
+}
+
+TEST_F(EndToEndReconnect, ASecondViewerOnTheSamePortNameTriesAgainAndConnectsWhenTheFirstHasGone) {
+    PallaxProcess service(world, serviceOf("a.pcap", 2));
+    EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
+    PallaxProcess first(world, {"--log-level", "3"});
+    (void)seen(first, kStarted);
+    PallaxProcess second(world, {"--log-level", "3"});
+    const auto failed = seen(second, kNoPorts);
+    EXPECT_EQ(second.err(), std::string("<3>Local messsage port already exists\n") + kNoPorts);
+    const auto failedAgain = seen(second, kNoPorts, 2);
+    EXPECT_GE(failedAgain - failed, kLeastDelay);
+    EXPECT_EQ(occurrences(second.err(), "<3>Local messsage port already exists\n"), 2);
+    EXPECT_TRUE(second.says("Connecting...\n"));
+    EXPECT_EQ(second.out(), "Connecting...\n");
+    end(first);
+    EXPECT_GE(seen(second, kStarted) - failedAgain, kLeastDelay);
+    EXPECT_TRUE(second.says("  MM Service State: REG_STATE_REGISTERING\n"));
+    end(second);
+    end(service);
+}
+
+} // namespace
+} // namespace pallax
