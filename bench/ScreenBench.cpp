@@ -1,4 +1,5 @@
 #include "app/PallaxPaneController.h"
+#include "platform/ui/Window.h"
 #include "ui/terminal/FrontEnd.h"
 
 #include <benchmark/benchmark.h>

@@ -56,10 +56,10 @@ void Grid::set(int x, int y, std::string text, Style style) {
 /// A half of a wide character that is overwritten leaves its other half blank.
 void Grid::separateWideCharacterAt(int x, int y) {
     if (_cells[index(x, y)].text.empty() && x > 0) {
-        _cells[index(x - 1, y)].text = " ";
+        _cells[index(x - 1, y)].text.assign(1, ' ');
     }
     if (x + 1 < _columns && _cells[index(x + 1, y)].text.empty()) {
-        _cells[index(x + 1, y)].text = " ";
+        _cells[index(x + 1, y)].text.assign(1, ' ');
     }
 }
 

@@ -62,7 +62,7 @@ std::vector<Cluster> clustersOf(std::string_view text) {
         } else if (columns > 0) {
             clusters.push_back({std::string(text.substr(at, size)), columns, at, size});
         } else if (clusters.empty()) {
-            clusters.push_back({" " + std::string(text.substr(at, size)), 1, at, size});
+            clusters.push_back({std::string(1, ' ').append(text.substr(at, size)), 1, at, size});
         } else {
             clusters.back().text += text.substr(at, size);
             clusters.back().bytes += size;
