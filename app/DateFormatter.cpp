@@ -1,10 +1,11 @@
 #include "app/DateFormatter.h"
 
 #include "platform/Clock.h"
-#include "platform/Format.h"
 
 #include <algorithm>
 #include <chrono>
+#include <cstddef>
+#include <cstdint>
 #include <optional>
 #include <utility>
 
@@ -37,6 +38,12 @@ std::optional<std::int64_t> fieldOf(char letter, std::chrono::local_seconds loca
     }
 }
 
+void appendPadded(std::string& text, std::int64_t number, std::size_t width) {
+    const std::string digits = std::to_string(number);
+    text.append(width - std::min(width, digits.size()), '0');
+    text += digits;
+}
+
 } // namespace
 
 DateFormatter::DateFormatter(std::string pattern, const Clock& clock)
@@ -55,7 +62,7 @@ std::string DateFormatter::stringFromDate(Time time) const {
             quoted = !quoted;
             ++at;
         } else if (const auto field = quoted ? std::nullopt : fieldOf(letter, local)) {
-            text += formatText("%0*ld", {runEnd - at, *field});
+            appendPadded(text, *field, static_cast<std::size_t>(runEnd - at));
             at = runEnd;
         } else {
             text += letter;

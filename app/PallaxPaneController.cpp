@@ -42,6 +42,13 @@ std::string valueText(const PallaxModelNode& leaf) {
     return text;
 }
 
+/// A label that the cell does not have takes no text.
+void setText(const std::shared_ptr<ui::Label>& label, std::string text) {
+    if (label) {
+        label->text = std::move(text);
+    }
+}
+
 /// The cell that the table has to spare, whatever kind it was made as.
 std::shared_ptr<PallaxCell> reusableCell(ui::TableView& table) {
     return std::dynamic_pointer_cast<PallaxCell>(table.dequeueReusableCell(kCellIdentifier));
@@ -121,11 +128,9 @@ std::shared_ptr<ui::TableCell> PallaxPaneController::cellForRow(std::size_t row)
         cell = std::make_shared<PallaxCell>(kind, kCellIdentifier, _toolkit.textMetrics());
         cell->setContentBounds(table().contentBounds());
     }
-    cell->key()->text = child->displayName();
+    setText(cell->key(), child->displayName());
     cell->setAccessory(isBranch ? ui::CellAccessory::DisclosureIndicator : ui::CellAccessory::None);
-    if (cell->value()) {
-        cell->value()->text = isBranch ? std::string() : valueText(*child);
-    }
+    setText(cell->value(), isBranch ? std::string() : valueText(*child));
     if (isBranch) {
         cell->setLayoutKey();
     } else {
