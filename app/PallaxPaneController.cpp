@@ -34,9 +34,10 @@ bool areNumbered(const std::vector<NodeRef>& children) {
     });
 }
 
-std::string valueText(const PallaxModelNode& leaf) {
+/// The text of a leaf's value; a branch, which has none, shows nothing.
+std::string valueText(const PallaxModelNode& node) {
     std::string text;
-    if (const PropertyList* value = leaf.value()) {
+    if (const PropertyList* value = node.value()) {
         value->appendString(text);
     }
     return text;
@@ -130,7 +131,7 @@ std::shared_ptr<ui::TableCell> PallaxPaneController::cellForRow(std::size_t row)
     }
     setText(cell->key(), child->displayName());
     cell->setAccessory(isBranch ? ui::CellAccessory::DisclosureIndicator : ui::CellAccessory::None);
-    setText(cell->value(), isBranch ? std::string() : valueText(*child));
+    setText(cell->value(), valueText(*child));
     if (isBranch) {
         cell->setLayoutKey();
     } else {

@@ -4,6 +4,9 @@
 #include "tests/doubles/RecordBuilder.h"
 #include "tests/doubles/TemplateCheck.h"
 
+#include <algorithm>
+#include <map>
+
 namespace pallax {
 namespace {
 

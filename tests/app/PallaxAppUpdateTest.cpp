@@ -1,5 +1,7 @@
 #include "tests/app/AppFixture.h"
 
+#include <algorithm>
+
 namespace pallax {
 namespace {
 
@@ -141,6 +143,7 @@ TEST_F(PallaxAppUpdateTest, APaneUncoveredByGoingBackShowsTheCurrentStatus) {
 TEST_F(PallaxAppUpdateTest, WhileDisconnectedTheTopPaneShowsConnectingWithDots) {
     browseThreeLevels();
     disconnect();
+    clock.advance(1s);
     app->updateViewControllerFromModel();
     EXPECT_EQ(statusOf(pane(2)), "Connecting... (loading)");
     EXPECT_EQ(statusOf(pane(1)), "Updated 2023-11-14 at 22:13:22");

@@ -1,6 +1,12 @@
 #include "platform/NumberFormat.h"
 #include "tests/app/PaneFixture.h"
 
+#include <rapidcheck.h>
+
+#include <algorithm>
+#include <set>
+#include <utility>
+
 namespace pallax {
 namespace {
 
@@ -134,6 +140,49 @@ TEST_F(PaneRowsTest, ARowThatHasMovedIsComparedByItsName) {
     const PaneRef pane = reloaded({leafNode("A", "1"), leafNode("B", "2"), leafNode("C", "3")},
                                   {leafNode("C", "3"), leafNode("A", "1"), leafNode("B", "4")});
     EXPECT_EQ(changes(*pane), "--*");
+}
+
+TEST_F(PaneRowsTest, RowsThatMoveAtEachReloadAreComparedWithTheLastOneOnly) {
+    const PaneRef pane = reloaded({leafNode("A", "1"), leafNode("B", "2")},
+                                  {leafNode("B", "2"), leafNode("A", "5")});
+    EXPECT_EQ(changes(*pane), "-*");
+    pane->reloadWithNode(treeNode("Section", {leafNode("A", "5"), leafNode("B", "3")}));
+    EXPECT_EQ(changes(*pane), "-*");
+}
+
+/// A few leaves, each name once, in any order.
+std::vector<std::pair<std::string, std::string>> anyLeaves() {
+    auto leaves = *rc::gen::container<std::vector<std::pair<std::string, std::string>>>(
+        rc::gen::pair(rc::gen::element<std::string>("A", "B", "C", "D", "E"),
+                      rc::gen::element<std::string>("1", "2")));
+    std::vector<std::pair<std::string, std::string>> unique;
+    std::set<std::string> names;
+    for (auto& leaf : leaves) {
+        if (names.insert(leaf.first).second) {
+            unique.push_back(std::move(leaf));
+        }
+    }
+    return unique;
+}
+
+TEST_F(PaneRowsTest, WhateverRowsComeGoAndMoveALeafIsComparedWithTheOneOfItsName) {
+    const auto nodes = [](const auto& leaves) {
+        std::vector<NodeRef> made;
+        for (const auto& [name, value] : leaves) {
+            made.push_back(leafNode(name, value));
+        }
+        return made;
+    };
+    EXPECT_TRUE(rc::check([&] {
+        const auto before = anyLeaves();
+        const auto now = anyLeaves();
+        const PaneRef pane = reloaded(nodes(before), nodes(now));
+        for (std::size_t row = 0; row < now.size(); ++row) {
+            const bool unchanged =
+                std::find(before.begin(), before.end(), now[row]) != before.end();
+            RC_ASSERT(pane->textOfRow(row).hasChanged != unchanged);
+        }
+    }));
 }
 
 TEST_F(PaneRowsTest, RowsWithOneNameAreComparedInTheirPlaces) {

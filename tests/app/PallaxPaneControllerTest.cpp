@@ -1,5 +1,7 @@
 #include "tests/app/PaneFixture.h"
 
+#include <algorithm>
+
 namespace pallax {
 namespace {
 
