@@ -34,12 +34,20 @@ bool areNumbered(const std::vector<NodeRef>& children) {
     });
 }
 
-std::string valueText(const PallaxModelNode& leaf) {
+/// The text of a leaf's value; a branch, which has none, shows nothing.
+std::string valueText(const PallaxModelNode& node) {
     std::string text;
-    if (const PropertyList* value = leaf.value()) {
+    if (const PropertyList* value = node.value()) {
         value->appendString(text);
     }
     return text;
+}
+
+/// A label that the cell does not have takes no text.
+void setText(const std::shared_ptr<ui::Label>& label, std::string text) {
+    if (label) {
+        label->text = std::move(text);
+    }
 }
 
 /// The cell that the table has to spare, whatever kind it was made as.
@@ -121,11 +129,9 @@ std::shared_ptr<ui::TableCell> PallaxPaneController::cellForRow(std::size_t row)
         cell = std::make_shared<PallaxCell>(kind, kCellIdentifier, _toolkit.textMetrics());
         cell->setContentBounds(table().contentBounds());
     }
-    cell->key()->text = child->displayName();
+    setText(cell->key(), child->displayName());
     cell->setAccessory(isBranch ? ui::CellAccessory::DisclosureIndicator : ui::CellAccessory::None);
-    if (cell->value()) {
-        cell->value()->text = isBranch ? std::string() : valueText(*child);
-    }
+    setText(cell->value(), valueText(*child));
     if (isBranch) {
         cell->setLayoutKey();
     } else {

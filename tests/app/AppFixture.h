@@ -1,0 +1,156 @@
+#pragma once
+
+#include "app/PallaxApp.h"
+#include "tests/doubles/FakeFileSystem.h"
+#include "tests/doubles/FakePreferences.h"
+#include "tests/doubles/FakeToolkit.h"
+#include "tests/monitor/ModelFixture.h"
+
+#include <memory>
+#include <span>
+#include <string>
+#include <utility>
+
+namespace pallax::doubles {
+
+/// Shows what the state holds, and saves the history: as the object-stream modem's generator,
+/// it adds no log of its own. Under the name "History" in `kHistoryTechnologies`.
+class HistoryGenerator final : public FakeGenerator {
+public:
+    explicit HistoryGenerator(const GeneratorEnvironment& environment)
+        : FakeGenerator(environment), _clock(environment.clock) {}
+    static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment) {
+        return std::make_unique<HistoryGenerator>(environment);
+    }
+
+    void updateState(Dictionary& state, Bytes data) override {
+        FakeGenerator::updateState(state, data);
+        state.set("DisplayState", PropertyList::data(packets.back()));
+        state.set("ExtraInfo", Dictionary());
+    }
+    PropertyList generateLogUsingState(Dictionary& state) override {
+        PropertyList shown = FakeGenerator::generateLogUsingState(state);
+        updateHistoryInState(state, _clock);
+        return shown;
+    }
+    PropertyList getSaveContentsFromState(const Dictionary& state) const override {
+        const PropertyList* history = state.find("History");
+        return history != nullptr ? history->shallowCopy() : PropertyList(Array());
+    }
+
+private:
+    const Clock& _clock;
+};
+
+inline constexpr Technology kHistoryTechnologies[] = {{"History", &HistoryGenerator::generator}};
+
+/// The application over a real model, among fakes; the modem answers "Fake" at first.
+class AppFixture : public ModelFixture {
+protected:
+    AppFixture() { model.reset(); } // the application makes its own
+
+    void SetUp() override {
+        ModelFixture::SetUp();
+        makeApp();
+    }
+
+    /// With the settings as they stand.
+    void makeApp() {
+        PallaxApp::Surroundings surroundings{
+            .toolkit = toolkit,
+            .files = *usedFiles,
+            .preferences = *usedPreferences,
+            .queue = queue,
+            .clock = clock,
+            .makeModel = [this](ModelObserver& application) { return makeModel(application); }};
+        if (!snapshotDirectory.empty()) {
+            surroundings.snapshotDirectory = snapshotDirectory;
+        }
+        if (!saveButtonMarker.empty()) {
+            surroundings.saveButtonMarker = saveButtonMarker;
+        }
+        app = std::make_unique<PallaxApp>(std::move(surroundings));
+    }
+    /// Launches the application and lets it connect.
+    void launch() {
+        app->applicationDidFinishLaunching();
+        queue.runReady();
+    }
+    /// One packet, which changes the display to `display`, and the next tick.
+    void tick(const PropertyList& display) {
+        ports.deliver({1});
+        queue.runReady();
+        generator().display = display;
+        advance(PallaxModel::kDisplayInterval);
+    }
+    /// The clock moves first, so that what falls due finds the time it is due at.
+    void advance(std::chrono::nanoseconds duration) {
+        clock.advance(duration);
+        queue.advance(duration);
+    }
+
+    FakeNavigationStack& stack() const {
+        return dynamic_cast<FakeNavigationStack&>(*app->navigationController());
+    }
+    PallaxPaneController& pane(std::size_t index) const {
+        return dynamic_cast<PallaxPaneController&>(*stack().screens().at(index));
+    }
+    std::size_t depth() const { return stack().screens().size(); }
+    PallaxPaneController& top() const { return pane(depth() - 1); }
+    /// Opens the row of that name in the top pane.
+    void openRow(const std::string& name) {
+        PallaxPaneController& current = top();
+        for (std::size_t row = 0; row < current.numberOfRows(); ++row) {
+            if (current.textOfRow(row).name == name) {
+                return current.didSelectRow(row);
+            }
+        }
+        FAIL() << "no row " << name;
+    }
+    /// "status" or, while loading, "status (loading)".
+    static std::string statusOf(const ui::Screen& screen) {
+        const auto& spinner = std::get<ui::ActivityIndicator>(screen.toolbarItems().at(0));
+        const auto& label = std::get<ui::Label>(screen.toolbarItems().at(1));
+        return label.text + (spinner.isSpinning ? " (loading)" : "");
+    }
+    static bool offersSave(const ui::Screen& screen) {
+        return screen.toolbarItems().size() > 3 &&
+               std::holds_alternative<ui::SaveButton>(screen.toolbarItems()[3]);
+    }
+    static std::string rowsOf(const PallaxPaneController& shown) {
+        std::string rows;
+        for (std::size_t row = 0; row < shown.numberOfRows(); ++row) {
+            const ui::RowText text = shown.textOfRow(row);
+            rows += (row == 0 ? "" : " ") + text.name + (text.value ? "=" + *text.value : "");
+        }
+        return rows;
+    }
+
+    FakeToolkit toolkit;
+    FakeFileSystem files;
+    FakePreferences preferences;
+    FileSystem* usedFiles = &files;
+    Preferences* usedPreferences = &preferences;
+    std::span<const Technology> spoken = kFakeTechnologies;
+    std::string snapshotDirectory; ///< empty: the built-in default
+    std::string saveButtonMarker;  ///< empty: the built-in default
+    PallaxModel* appModel = nullptr;
+    std::unique_ptr<PallaxApp> app;
+
+private:
+    std::unique_ptr<PallaxModel> makeModel(ModelObserver& application) {
+        toolkit.diary.emplace_back("make model");
+        auto made = std::make_unique<PallaxModel>(
+            PallaxModel::Platform{.ports = ports,
+                                  .telephony = telephony,
+                                  .queue = queue,
+                                  .timers = queue,
+                                  .generators = {clock, resources, bundle, standardOutput},
+                                  .technologies = spoken,
+                                  .observer = application});
+        appModel = made.get();
+        return made;
+    }
+};
+
+} // namespace pallax::doubles
