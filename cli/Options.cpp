@@ -86,14 +86,15 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
                                    {"always", terminal::ColorUse::Always},
                                    {"never", terminal::ColorUse::Never}},
                                   "Colour on the screen (default: auto, unless NO_COLOR is set)");
-    app.add_flag("!--no-mouse", options.mouse,
-                 "Leave the mouse to the terminal, so that text can be selected");
+    app.add_flag_callback(
+        "--no-mouse", [&options] { options.mouse = false; },
+        "Leave the mouse to the terminal, so that text can be selected");
     addPlay(app, options.play, recording);
     app.add_flag("--keep-going", options.keepGoing,
                  "Drop a record that cannot be read instead of ending with status 70");
     app.add_option("--log-level", options.logLevel,
                    "Write system-log lines up to this priority to standard error")
-        ->check(CLI::Range(0, kHighestLevel).name(""))
+        ->check(CLI::Range(0, kHighestLevel).name("").description(""))
         ->type_name("0-7");
 }
 

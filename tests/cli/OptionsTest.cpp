@@ -46,6 +46,23 @@ TEST(Options, ARecordingIsBrowsed) {
     EXPECT_EQ(parsed<BrowseOptions>({"-"}).recording, "-");
 }
 
+TEST(Options, ColourAndMouseAreTheTerminalsUnlessToldOtherwise) {
+    const auto plain = std::get<BrowseOptions>(parseOptions({"a.pcap"}));
+    EXPECT_EQ(plain.color, terminal::ColorUse::Auto);
+    EXPECT_TRUE(plain.mouse);
+    const auto told =
+        std::get<BrowseOptions>(parseOptions({"a.pcap", "--color=never", "--no-mouse"}));
+    EXPECT_EQ(told.color, terminal::ColorUse::Never);
+    EXPECT_FALSE(told.mouse);
+    const auto always = std::get<BrowseOptions>(parseOptions({"--color", "always"}));
+    EXPECT_EQ(always.color, terminal::ColorUse::Always);
+    const auto wrong = std::get<ParseEnd>(parseOptions({"--color", "blue"}));
+    EXPECT_EQ(wrong.status, kExitWrongUsage);
+    EXPECT_EQ(
+        wrong.text,
+        "pallax: --color: \"blue\" is none of auto|always|never (pallax --help tells more)\n");
+}
+
 TEST(Options, ARecordingNamedLikeACommandIsGivenWithItsFolder) {
     EXPECT_EQ(parsed<BrowseOptions>({"./decode"}).recording, "./decode");
 }
