@@ -1,5 +1,6 @@
 #include "LogGenerator/Technologies/Technologies.h"
 
+#include "LogGenerator/C2K/C2KLogGenerator.h"
 #include "LogGenerator/LTE/LTELogGenerator.h"
 #include "LogGenerator/UTRAN/UTRANLogGenerator.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMLogGenerator.h"
@@ -12,6 +13,7 @@ namespace pallax {
 std::span<const Technology> technologies() {
     static constexpr auto kTechnologies = std::to_array<Technology>({
         {kHXLogChannelTechnology_Zorell_GSM, ZOR_GSMLogGenerator::generator},
+        {kHXLogChannelTechnology_Zorell_CDMA, C2KLogGenerator::generator},
         {kHXLogChannelTechnology_Zorell_LTE, LTELogGenerator::generator},
         {kHXLogChannelTechnology_Zorell_UTRAN2, UTRANLogGenerator::generator},
     });
