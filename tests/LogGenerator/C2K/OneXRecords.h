@@ -1,6 +1,6 @@
 #pragma once
 
-#include "tests/LogGenerator/C2K/SubpacketBuilder.h"
+#include "tests/doubles/SubpacketBuilder.h"
 
 namespace pallax::doubles {
 

@@ -1,6 +1,6 @@
 #include "LogGenerator/C2K/Subpackets.h"
 
-#include "tests/LogGenerator/C2K/SubpacketBuilder.h"
+#include "tests/doubles/SubpacketBuilder.h"
 #include "tests/doubles/RecordProperties.h"
 #include "tests/doubles/RecordingLog.h"
 
