@@ -21,7 +21,7 @@ constexpr auto kWeights = std::to_array<std::int64_t>(
 std::vector<std::size_t> countersOf(std::size_t rate) {
     std::vector<std::size_t> offsets;
     for (std::size_t block = 0; block < 3; ++block) {
-        for (const std::size_t first : {18, 22, 26, 30, 306, 310, 314, 318}) {
+        for (const std::size_t first : {18U, 22U, 26U, 30U, 306U, 310U, 314U, 318U}) {
             offsets.push_back(24 * rate + 576 * block + first);
         }
     }
