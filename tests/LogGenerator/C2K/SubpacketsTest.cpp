@@ -1,8 +1,8 @@
 #include "LogGenerator/C2K/Subpackets.h"
 
-#include "tests/doubles/SubpacketBuilder.h"
 #include "tests/doubles/RecordProperties.h"
 #include "tests/doubles/RecordingLog.h"
+#include "tests/doubles/SubpacketBuilder.h"
 
 #include <gtest/gtest.h>
 
