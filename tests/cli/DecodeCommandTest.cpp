@@ -204,10 +204,10 @@ TEST_F(DecodeCommandTest, AForeignLinkTypeNeedsTheTechnologyOption) {
 }
 
 TEST_F(DecodeCommandTest, ATechnologyWithoutAGeneratorIsNamed) {
-    add("c2k.pcap", {{milliseconds(0), "A=1"}}, &doubles::kUnknownToGenerators);
+    add("other.pcap", {{milliseconds(0), "A=1"}}, &doubles::kUnknownToGenerators);
     EXPECT_EQ(run(), kExitFailure);
     EXPECT_EQ(reports, std::vector<std::string>{
-                           "c2k.pcap: there is no log generator for the technology Zorell_CDMA."});
+                           "other.pcap: there is no log generator for the technology Another."});
 }
 
 TEST_F(DecodeCommandTest, CsvGivesARowForEachChangeFromTickToTick) {

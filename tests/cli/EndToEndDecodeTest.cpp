@@ -42,6 +42,26 @@ TEST_F(EndToEnd, DecodeGivesTheDisplayAfterTheLastPacket) {
     EXPECT_EQ(lines[0]["Process CO"]["MM Service State"], "REG_STATE_REGISTERING");
 }
 
+TEST_F(EndToEnd, DecodeOfTheCDMASampleShowsEveryRowFilled) {
+    const Run end = run({"decode", "--every", "end", PALLAX_SOURCE_DIR "/samples/cdma-drive.pcap"});
+    EXPECT_EQ(end.status, 0);
+    EXPECT_EQ(end.err, "");
+    EXPECT_EQ(end.out.find(":\"\""), std::string::npos) << end.out;
+    const auto display = linesOf(end.out).at(0);
+    EXPECT_EQ(display["1x"]["Frame Error Rate"], "2.36% (old)");
+    EXPECT_EQ(display["EV-DO"]["Active Set"]["1;4"], "-9.46 dB");
+    EXPECT_EQ(display["Data Rates"]["Forward Link"], "633.00 kbps");
+}
+
+TEST_F(EndToEnd, DecodeOfTheObjectStreamShowsItsNestedObjects) {
+    const Run end = run({"decode", PALLAX_SOURCE_DIR "/samples/ifx-stream.pcap"});
+    EXPECT_EQ(end.status, 0);
+    EXPECT_EQ(end.err, "");
+    const auto display = linesOf(end.out).at(0);
+    EXPECT_EQ(display["Neighbour Cells"][3], "103");
+    EXPECT_EQ(display["RR"], "Idle");
+}
+
 TEST_F(EndToEnd, DecodeAtEachTickAndPacket) {
     const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)},
                                                     {milliseconds(1500), registration(2)},

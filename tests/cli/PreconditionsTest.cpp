@@ -13,7 +13,7 @@ using doubles::ScriptedRecording;
 TEST(Preconditions, ATechnologyWithoutAGeneratorIsASentence) {
     const ScriptedRecording recording("a.pcap", {}, &doubles::kUnknownToGenerators);
     EXPECT_EQ(missingGenerator(recording, kScriptedTechnologies),
-              "a.pcap: there is no log generator for the technology Zorell_CDMA.");
+              "a.pcap: there is no log generator for the technology Another.");
 }
 
 TEST(Preconditions, ATechnologyOfTheTableIsNone) {

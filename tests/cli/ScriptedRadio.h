@@ -76,7 +76,7 @@ inline constexpr Technology kScriptedTechnologies[] = {
 };
 
 inline constexpr RecordedTechnology kScriptedLte{150, "Zorell_LTE", "lte"};
-inline constexpr RecordedTechnology kUnknownToGenerators{149, "Zorell_CDMA", "cdma"};
+inline constexpr RecordedTechnology kUnknownToGenerators{0, "Another", "other"};
 
 class ScriptedRecording final : public Recording {
 public:

@@ -87,6 +87,24 @@ TEST_F(C2KLogGeneratorTest, ATemplateKeptInTheStateIsNotLoadedAgain) {
     EXPECT_EQ(display(), PropertyList(Dictionary{{"Only", "25"}}));
 }
 
+TEST_F(C2KLogGeneratorTest, EvenAPacketThatIsIgnoredMakesTheDisplay) {
+    _state.set("ExtraInfo", Dictionary{{"of", "another technology"}});
+    feed({});
+    ASSERT_TRUE(_state.contains("Display"));
+    EXPECT_EQ(display(), displayOn(""));
+    EXPECT_EQ(_lines, (Lines{{4, "Processing the template"}, {4, "Processing the template"}}));
+    EXPECT_EQ(*_state.find("ExtraInfo"), PropertyList(Dictionary()));
+}
+
+TEST_F(C2KLogGeneratorTest, OnlyOnePrefixIsStripped) {
+    (void)_generator.getDisplayFromState(_state);
+    ByteBuffer message = statusOn(25).prefixed();
+    message.insert(message.begin(), {0x81, 0x00});
+    feed(message);
+    EXPECT_EQ(_lines, (Lines{{6, "Log Header 0x81"}, {3, "Invalid log type: 81. Dropping."}}));
+    EXPECT_EQ(display(), displayOn(""));
+}
+
 TEST_F(C2KLogGeneratorTest, APacketOf12BytesIsIgnoredSilently) {
     (void)_generator.getDisplayFromState(_state);
     ByteBuffer message = statusOn(25).bytes();

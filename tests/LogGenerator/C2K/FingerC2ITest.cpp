@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
+
 namespace pallax {
 namespace {
 
@@ -96,6 +98,27 @@ TEST(FingerC2I, AnyLengthButThatOfItsFingersIsAnError) {
                                         "substructs (size=23)."}}));
     EXPECT_EQ(fixture.writtenBy(Record(0x108A).padTo(23 + 255 * 14).at(22, 255)).size(), 1U);
     cutPacketAtEveryLength(fingers({{168, 512}, {4, 512}}).u8(0), 51);
+}
+
+TEST(FingerC2I, TheRatioIsComputedInDoublePrecision) {
+    C2KFixture fixture;
+    fixture.feed(fingers({{0, 100}}));
+    EXPECT_EQ(fixture.value("kFingerC2I").dictionary()->find("0;0")->displayNumber()->real(),
+              10.0 * std::log10(100 / 512.0));
+}
+
+TEST(FingerC2I, AnyFingersWriteOnlyItsRow) {
+    EXPECT_TRUE(rc::check([] {
+        C2KFixture fixture;
+        std::vector<Finger> any;
+        for (int count = *rc::gen::inRange(0, 6); count > 0; --count) {
+            any.push_back({*rc::gen::inRange(0U, 0x10000U), *rc::gen::inRange(0U, 0x10000U)});
+        }
+        const Dictionary rows = fixture.writtenBy(fingers(any));
+        RC_ASSERT(rows.size() == 1U);
+        RC_ASSERT(rows.contains("kFingerC2I"));
+        (void)fixture.value("kFingerC2I").description();
+    }));
 }
 
 TEST(FingerC2I, AnyBytesWriteOnlyItsRow) {

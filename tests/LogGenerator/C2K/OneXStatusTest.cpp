@@ -1,9 +1,13 @@
 #include "LogGenerator/C2K/OneXStatus.h"
 
+#include "LogGenerator/C2K/TrafficFER.h"
 #include "tests/LogGenerator/C2K/C2KFixture.h"
 #include "tests/LogGenerator/C2K/OneXRecords.h"
 
 #include <gtest/gtest.h>
+
+#include <set>
+#include <string>
 
 namespace pallax {
 namespace {
@@ -94,6 +98,8 @@ TEST(OneXStatus, GainsAreSignedAndScaled) {
     EXPECT_EQ(gains(1, 0, 235), "-62.91 dBm, -63.25 dBm, +23.50 dBm");
     EXPECT_EQ(fixture.value("k1xRxAGC0").displayNumber()->real(), 1.0 * 334 / 1000 - 63.248);
     EXPECT_EQ(fixture.value("k1xRxAGC0").displayNumber()->unit(), "dBm");
+    (void)gains(0, 0, -123);
+    EXPECT_EQ(fixture.value("k1xTxAGC").displayNumber()->real(), -123 / 10.0);
 }
 
 TEST(OneXStatus, ChannelsAreUnsigned16BitNumbers) {
@@ -200,12 +206,49 @@ TEST(OneXStatus, WithoutAnyRateNoneIsShownAsOld) {
     EXPECT_EQ(fixture.text("k1xTrafficFER"), "100.00% (old)");
 }
 
-TEST(OneXStatus, AnyBytesWriteOnlyItsRows) {
-    anyPacketWritesOnly(0x119C,
-                        {"k1xDeviceState", "k1xRx0BandClass", "k1xRx0ChanNum", "k1xRxAGC0",
-                         "k1xRx1BandClass", "k1xRx1ChanNum", "k1xRxAGC1", "k1xTxAGC",
-                         "k1xActiveSetInfo", "k1xTrafficFER"},
-                        {17, 60, 120, 300});
+TEST(OneXStatus, AnySubpacketsWriteOnlyItsRows) {
+    EXPECT_TRUE(rc::check([] {
+        C2KFixture fixture;
+        fixture.state.set("TrafficFER", PropertyList::real(0.5));
+        const Dictionary rows = fixture.writtenBy(
+            packetOf(0x119C, {anySubpacket(1), anySubpacket(2), anySubpacket(3), anySubpacket(4)}));
+        std::set<std::string> names;
+        for (const auto& row : rows) {
+            names.insert(row.key.string());
+            (void)row.value.description();
+        }
+        std::set<std::string> expected = {"k1xDeviceState", "k1xRx0BandClass", "k1xRx0ChanNum",
+                                          "k1xRxAGC0",      "k1xRx1BandClass", "k1xRx1ChanNum",
+                                          "k1xRxAGC1",      "k1xTxAGC",        "k1xActiveSetInfo"};
+        if (fixture.text("k1xDeviceState") != "Traffic [8]") {
+            expected.insert("k1xTrafficFER");
+        }
+        RC_ASSERT(names == expected);
+    }));
+}
+
+TEST(OneXStatus, InEveryStateButTrafficTheRateOfTheCallIsShownAsOld) {
+    for (const unsigned state : {0U, 7U, 9U, 11U, 255U}) {
+        C2KFixture fixture;
+        fixture.feed(trafficFrame(1));
+        fixture.feed(oneXStatus(state));
+        EXPECT_EQ(fixture.text("k1xTrafficFER"), "1.56% (old)") << state;
+        EXPECT_FALSE(fixture.state.contains("TrafficFER")) << state;
+    }
+}
+
+TEST(OneXStatus, APacketThatIsRefusedLeavesTheRateOfTheCall) {
+    C2KFixture fixture;
+    fixture.feed(trafficFrame(1));
+    EXPECT_TRUE(fixture.writtenBy(Record(0x119C).padTo(16)).empty());
+    EXPECT_TRUE(fixture.writtenBy(packetOf(0x119C, {systemState(6), radio(), noPilots()})).empty());
+    EXPECT_EQ(fixture.state.find("TrafficFER")->real(), 0.015625);
+}
+
+TEST(OneXStatus, TheOldRateIsMadeAPercentageInSinglePrecision) {
+    const volatile float single = 0.1F * 100.0F;
+    ASSERT_NE(double{0.1F} * 100.0, static_cast<double>(single));
+    EXPECT_EQ(shownOldTrafficFER(0.1F).displayNumber()->real(), static_cast<double>(single));
 }
 
 } // namespace

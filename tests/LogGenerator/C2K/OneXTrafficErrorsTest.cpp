@@ -141,8 +141,14 @@ TEST(OneXTrafficErrors, InACutPacketTheFrameCountsWhereverTheWalkFindsIt) {
     EXPECT_EQ(shown(46), "1.56%");
 }
 
-TEST(OneXTrafficErrors, AnyBytesWriteOnlyItsRow) {
-    anyPacketWritesOnly(0x119D, {"k1xTrafficFER"}, {17, 46, 120});
+TEST(OneXTrafficErrors, AnySubpacketsWriteOnlyItsRow) {
+    EXPECT_TRUE(rc::check([] {
+        C2KFixture fixture;
+        const Dictionary rows =
+            fixture.writtenBy(packetOf(0x119D, {anySubpacket(5), anySubpacket(11)}));
+        RC_ASSERT(rows.size() == 1U);
+        RC_ASSERT(rows.contains("k1xTrafficFER"));
+    }));
 }
 
 } // namespace

@@ -1,8 +1,8 @@
 #include "LogGenerator/C2K/Subpackets.h"
 
+#include "tests/LogGenerator/C2K/OneXRecords.h"
 #include "tests/doubles/RecordProperties.h"
 #include "tests/doubles/RecordingLog.h"
-#include "tests/doubles/SubpacketBuilder.h"
 
 #include <gtest/gtest.h>
 
@@ -99,8 +99,16 @@ TEST(Subpackets, AHeaderThatThePacketCutsIsReadAsFarAsItGoes) {
 
 TEST(Subpackets, WhateverIsFoundHasItsIdAndLiesInThePacket) {
     EXPECT_TRUE(rc::check([] {
-        const ByteBuffer bytes = *anyRecordBytes();
-        const auto id = *rc::gen::inRange<std::uint8_t>(1, 12);
+        std::vector<Subpacket> subpackets;
+        for (int count = *rc::gen::inRange(1, 6); count > 0; --count) {
+            subpackets.push_back(anySubpacket(*rc::gen::inRange(1U, 5U)));
+            if (*rc::gen::inRange(0, 4) == 0) {
+                subpackets.back().claim(*rc::gen::inRange(0U, 100U));
+            }
+        }
+        ByteBuffer bytes = packetOf(0x119C, subpackets).bytes();
+        bytes.resize(*rc::gen::inRange<std::size_t>(kSubpacketsStart, bytes.size() + 1));
+        const auto id = *rc::gen::inRange<std::uint8_t>(1, 5);
         const LogRecord packet{Bytes(bytes)};
         if (const auto found = findSubpacket(packet, id)) {
             RC_ASSERT(found->u8(0) == id);
