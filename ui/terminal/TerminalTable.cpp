@@ -61,6 +61,9 @@ void TerminalTable::setViewport(std::size_t rows, ui::Rect contentBounds) {
         _contentBounds = contentBounds;
         _sidewaysOffset = 0;
     }
+    if (!_cursorName) {
+        rememberCursor(); // of a table that was never reloaded
+    }
     keepCursorInWindow();
 }
 
@@ -138,9 +141,11 @@ void TerminalTable::filterRows() {
     }
 }
 
+/// Where there is no row for now, the last one's name is kept: it may come back.
 void TerminalTable::rememberCursor() {
-    const auto row = cursorRow();
-    _cursorName = row ? std::optional(_source.textOfRow(*row).name) : std::nullopt;
+    if (const auto row = cursorRow()) {
+        _cursorName = _source.textOfRow(*row).name;
+    }
 }
 
 /// Mostly the row is where it was. Otherwise the nearest one of that name is taken, and where

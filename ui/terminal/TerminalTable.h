@@ -73,7 +73,7 @@ private:
     std::size_t _windowRows = 1;
     std::size_t _firstShown = 0;
     std::size_t _cursor = 0;
-    std::optional<std::string> _cursorName; // of the row under the cursor
+    std::optional<std::string> _cursorName; // of the row under the cursor, or the last one there
     std::string _filter;
     std::vector<std::size_t> _matches; // the rows that pass, while there is a filter
     int _sidewaysOffset = 0;

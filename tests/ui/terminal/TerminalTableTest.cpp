@@ -102,6 +102,26 @@ TEST_F(TerminalTableTest, TheCursorStaysOnItsRowWhenRowsCome) {
     EXPECT_EQ(window(), "A B [C] ");
 }
 
+TEST_F(TerminalTableTest, ACursorThatWasNeverMovedStaysOnItsRowToo) {
+    reload({"0", "A", "B"});
+    EXPECT_EQ(window(), "0 [A] B ");
+}
+
+TEST_F(TerminalTableTest, TheCursorComesBackToItsRowWhenAllRowsWereGone) {
+    table.moveCursorTo(2);
+    reload({});
+    table.moveCursor(1);
+    reload({"A", "B", "C", "D"});
+    EXPECT_EQ(window(), "A B [C] ");
+}
+
+TEST_F(TerminalTableTest, TheCursorComesBackToItsRowWhenNoRowPassedTheFilter) {
+    table.moveCursorTo(3);
+    table.setFilter("no such row");
+    table.setFilter("");
+    EXPECT_EQ(window(), "B C [D] ");
+}
+
 TEST_F(TerminalTableTest, TheCursorStaysOnItsRowWhenRowsGo) {
     table.moveCursorTo(3);
     reload({"B", "D"});
