@@ -120,11 +120,11 @@ bool TerminalTable::scrollSideways(int columns) {
     }
     const int beyond =
         columnOf(std::max(container->contentSize.width - container->frame.size.width, 0.0));
-    const int offset = std::clamp(_sidewaysOffset + columns, 0, beyond);
-    if (offset == _sidewaysOffset) {
+    const int current = std::min(_sidewaysOffset, beyond); // new data may be shorter
+    _sidewaysOffset = std::clamp(current + columns, 0, beyond);
+    if (_sidewaysOffset == current) {
         return false;
     }
-    _sidewaysOffset = offset;
     _needsDisplay();
     return true;
 }

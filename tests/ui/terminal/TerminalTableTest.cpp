@@ -254,6 +254,21 @@ TEST_F(TerminalTableTest, AnotherRowOrAnotherWidthIsNotScrolled) {
     EXPECT_EQ(table.sidewaysOffset(), 0);
 }
 
+TEST_F(TerminalTableTest, AScrolledRowThatNewDataShortensScrollsFromWhereItIsSeen) {
+    show(3, 22);
+    source.rows = {leafRow("Name of 14 col", "123456")};
+    table.reloadData();
+    table.scrollSideways(20);
+    source.rows = {leafRow("Name of 14 col", "12")}; // scrolls by 16 columns, no more
+    table.reloadData();
+    EXPECT_FALSE(table.scrollSideways(8));
+    EXPECT_TRUE(table.scrollSideways(-8));
+    EXPECT_EQ(table.sidewaysOffset(), 8);
+    source.rows = {leafRow("Name of 14 col", "")}; // fits
+    table.reloadData();
+    EXPECT_FALSE(table.scrollSideways(-8));
+}
+
 TEST_F(TerminalTableTest, AWindowThatGrowsLeavesNoRoomBelowTheLastRow) {
     table.moveToEnd();
     show(4);
