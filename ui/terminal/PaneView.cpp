@@ -118,7 +118,10 @@ void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y) {
 void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const ui::RowText& row,
                         int y, bool isSelected) {
     const ui::CellContents contents = cell.contents();
-    const int width = columnOf(cell.contentBounds().size.width);
+    const std::string count = row.elements ? std::to_string(*row.elements) : "";
+    // A count stands at the end of the room for texts, behind a blank.
+    const int width =
+        columnOf(cell.contentBounds().size.width) - (count.empty() ? 0 : columnsOf(count) + 1);
     int offset = 0;
     if (contents.container != nullptr) {
         const int beyond = columnOf(contents.container->contentSize.width) -
@@ -140,10 +143,7 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const u
     const int last = _grid.columns() - 1;
     if (cell.accessory() == ui::CellAccessory::DisclosureIndicator) {
         _grid.put(last, y, _marks.disclosure, {.accent = isSelected});
-        if (row.elements) {
-            const std::string count = std::to_string(*row.elements);
-            _grid.put(last - 1 - columnsOf(count), y, count, kDim);
-        }
+        _grid.put(last - 1 - columnsOf(count), y, count, kDim);
     } else if (row.hasChanged) {
         _grid.put(last, y, _marks.changed, kBold);
     }

@@ -162,6 +162,21 @@ TEST_F(PaneViewTest, ASectionShowsNamesLeftAndValuesRight) {
 )");
 }
 
+TEST_F(PaneViewTest, ALongNameEndsBeforeTheCountBehindIt) {
+    stage.tick(Dictionary{{"Measured Neighbor Cells", Array{"a", "b", "c"}},
+                          {"Sixteen Columns.", Array{"a", "b", "c"}},
+                          {"Fifteen Columns", Array{"a", "b", "c"}}});
+    EXPECT_EQ(stage.screen(20, 7), R"(
+ Pallax
+ ──────────────────
+▌Measured Neigh… 3 ›
+ Sixteen Column… 3 ›
+ Fifteen Columns 3 ›
+ ──────────────────
+ Updated 2023-11-14
+)");
+}
+
 TEST_F(PaneViewTest, MoreRowsThanRoomScrollWithTheCursor) {
     stage.tick(display());
     stage.press(Key::Enter);
