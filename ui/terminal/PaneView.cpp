@@ -54,6 +54,26 @@ std::string breadcrumbs(const TerminalNavigation& navigation, const Marks& marks
     return path;
 }
 
+/// Bytes [begin, end) of a text.
+struct Range {
+    std::size_t begin = 0;
+    std::size_t end = 0;
+};
+
+/// A range of `text` widened to whole characters, each with the combining ones that follow it.
+Range wholeCharacters(std::string_view text, Range range) {
+    Range whole = range;
+    for (const Cluster& cluster : clustersOf(text)) {
+        if (cluster.offset <= range.begin) {
+            whole.begin = cluster.offset;
+        }
+        if (cluster.offset < range.end) {
+            whole.end = cluster.offset + cluster.bytes;
+        }
+    }
+    return whole;
+}
+
 } // namespace
 
 bool isLoading(const ui::BarItems& items) {
@@ -158,11 +178,12 @@ void PaneView::drawLabel(const ui::Label& label, int x, int y, Style style, Span
         _grid.put(x, y, text, style, clip);
         return;
     }
+    const Range found = wholeCharacters(text, {match, match + filter.size()});
     Style underlined = style;
     underlined.underline = true;
-    x = _grid.put(x, y, text.substr(0, match), style, clip);
-    x = _grid.put(x, y, text.substr(match, filter.size()), underlined, clip);
-    _grid.put(x, y, text.substr(match + filter.size()), style, clip);
+    x = _grid.put(x, y, text.substr(0, found.begin), style, clip);
+    x = _grid.put(x, y, text.substr(found.begin, found.end - found.begin), underlined, clip);
+    _grid.put(x, y, text.substr(found.end), style, clip);
 }
 
 void PaneView::drawToolbar(const TerminalNavigation& navigation, const TerminalTable& table,

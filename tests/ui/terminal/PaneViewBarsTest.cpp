@@ -141,6 +141,21 @@ TEST_F(PaneViewBarsTest, AMatchInAValueIsUnderlined) {
     EXPECT_EQ(styleAt(37, 3), Style{.underline = true});
 }
 
+TEST_F(PaneViewBarsTest, AMatchInsideACombinedCharacterUnderlinesAllOfIt) {
+    openSection({{"Cafe\u0301 au lait", "e\u0301"}});
+    stage.frontEnd.resize(40, 12);
+    stage.type("/e");
+    EXPECT_EQ(stage.line(2), "▌Cafe\u0301 au lait                        e\u0301");
+    EXPECT_EQ(styleAt(3, 2), (Style{.bold = true, .accent = true}));
+    EXPECT_EQ(styleAt(4, 2), (Style{.bold = true, .underline = true, .accent = true}));
+    EXPECT_EQ(styleAt(5, 2), (Style{.bold = true, .accent = true}));
+    EXPECT_EQ(styleAt(37, 2), (Style{.underline = true, .accent = true}));
+    stage.press(Key::Backspace);
+    stage.type("\u0301");
+    EXPECT_EQ(stage.line(2), "▌Cafe\u0301 au lait                        e\u0301");
+    EXPECT_EQ(styleAt(4, 2), (Style{.bold = true, .underline = true, .accent = true}));
+}
+
 TEST_F(PaneViewBarsTest, AKeptFilterStaysInSightByItsCountAndItsHint) {
     stage.tick(display());
     stage.press(Key::Enter);
