@@ -1,4 +1,4 @@
-#include "tests/ui/terminal/PaneViewFixture.h"
+#include "tests/ui/terminal/StageFixture.h"
 #include "ui/terminal/PaneView.h"
 
 #include <gtest/gtest.h>
@@ -8,7 +8,7 @@
 namespace pallax::terminal {
 namespace {
 
-using PaneViewBarsTest = PaneViewFixture;
+using PaneViewBarsTest = StageFixture;
 
 TEST_F(PaneViewBarsTest, BreadcrumbsAreShortenedFromTheLeft) {
     stage.tick(

@@ -1,13 +1,13 @@
 #include "ui/terminal/PaneView.h"
 
-#include "tests/ui/terminal/PaneViewFixture.h"
+#include "tests/ui/terminal/StageFixture.h"
 
 #include <gtest/gtest.h>
 
 namespace pallax::terminal {
 namespace {
 
-using PaneViewTest = PaneViewFixture;
+using PaneViewTest = StageFixture;
 
 TEST_F(PaneViewTest, APaneWithoutDataIsEmptyAboveASpinner) {
     EXPECT_EQ(stage.screen(80, 24), R"(

@@ -1,4 +1,4 @@
-#include "tests/ui/terminal/PaneViewFixture.h"
+#include "tests/ui/terminal/StageFixture.h"
 #include "ui/terminal/PaneView.h"
 
 #include <gtest/gtest.h>
@@ -11,7 +11,7 @@
 namespace pallax::terminal {
 namespace {
 
-using PaneViewTextTest = PaneViewFixture;
+using PaneViewTextTest = StageFixture;
 
 TEST_F(PaneViewTextTest, ALongRowEndsInAMarkAndScrollsSideways) {
     openSection({{"A name of 22 columns..", "a value of twenty-five..."}, {"Next", "1"}});

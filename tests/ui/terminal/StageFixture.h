@@ -8,8 +8,8 @@
 
 namespace pallax::terminal {
 
-/// A pane on the stage.
-class PaneViewFixture : public testing::Test {
+/// The stage, and how what is on it looks.
+class StageFixture : public testing::Test {
 protected:
     /// One section of these entries, opened.
     void openSection(const Dictionary& section, const char* name = "Section") {
