@@ -98,8 +98,11 @@ void FrontEnd::handle(const KeyEvent& event) {
 void FrontEnd::handleMouse(const KeyEvent& event) {
     constexpr std::ptrdiff_t kWheelRows = 3;
     if (event.key != Key::Click) {
-        if (!_toolkit.navigation()->modal()) {
-            table()->moveCursor(event.key == Key::WheelUp ? -kWheelRows : kWheelRows);
+        const std::ptrdiff_t rows = event.key == Key::WheelUp ? -kWheelRows : kWheelRows;
+        if (const auto& modal = _toolkit.navigation()->modal()) {
+            terminalTable(modal->list()).scroll(rows);
+        } else {
+            table()->moveCursor(rows);
         }
         return;
     }
@@ -139,7 +142,7 @@ void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
     }
     if (event.key == Key::PageUp || event.key == Key::PageDown) {
         TerminalTable& list = terminalTable(screen.list());
-        list.moveCursor(event.key == Key::PageUp ? -list.page() : list.page());
+        list.scroll(event.key == Key::PageUp ? -list.page() : list.page());
         return;
     }
     const bool forwards = event.key == Key::Tab || event.key == Key::Down;

@@ -96,6 +96,13 @@ void TerminalTable::moveCursorTo(std::size_t shown) {
     _needsDisplay();
 }
 
+void TerminalTable::scroll(std::ptrdiff_t rows) {
+    const auto last = static_cast<std::ptrdiff_t>(lastFirstShown());
+    const auto target = static_cast<std::ptrdiff_t>(_firstShown) + rows;
+    _firstShown = static_cast<std::size_t>(std::clamp<std::ptrdiff_t>(target, 0, last));
+    moveCursorTo(std::clamp(_cursor, _firstShown, _firstShown + _windowRows - 1));
+}
+
 std::ptrdiff_t TerminalTable::page() const {
     return static_cast<std::ptrdiff_t>(std::max<std::size_t>(_windowRows, 2) - 1);
 }
@@ -171,10 +178,13 @@ void TerminalTable::findCursor() {
     rememberCursor();
 }
 
-void TerminalTable::keepCursorInWindow() {
+std::size_t TerminalTable::lastFirstShown() const {
     const std::size_t count = shownRows();
-    const std::size_t lastFirst = count > _windowRows ? count - _windowRows : 0;
-    _firstShown = std::min(_firstShown, lastFirst);
+    return count > _windowRows ? count - _windowRows : 0;
+}
+
+void TerminalTable::keepCursorInWindow() {
+    _firstShown = std::min(_firstShown, lastFirstShown());
     if (_cursor < _firstShown) {
         _firstShown = _cursor;
     } else if (_cursor >= _firstShown + _windowRows) {

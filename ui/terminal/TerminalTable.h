@@ -45,6 +45,8 @@ public:
     /// Moves by so many rows, stopping at the ends.
     void moveCursor(std::ptrdiff_t rows);
     void moveCursorTo(std::size_t shown);
+    /// Moves the window by so many rows, stopping at the ends; the cursor stays inside it.
+    void scroll(std::ptrdiff_t rows);
     /// A window's height, less one row.
     std::ptrdiff_t page() const;
     void moveToEnd() { moveCursorTo(shownRows()); }
@@ -65,6 +67,8 @@ private:
     void filterRows();
     void rememberCursor();
     void findCursor();
+    /// The last row at which a window can begin without room below its rows.
+    std::size_t lastFirstShown() const;
     void keepCursorInWindow();
 
     ui::TableSource& _source;

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <string>
+#include <string_view>
 
 namespace pallax::terminal {
 namespace {
@@ -31,6 +32,24 @@ protected:
     std::string focusAfter(Key key) {
         stage.press(key);
         return focus();
+    }
+    /// A save screen with the items 0 to 8 and room for four.
+    void openNineItems() {
+        stage.closeSaveScreen();
+        Array items;
+        for (int item = 0; item < 9; ++item) {
+            items.emplace_back(Dictionary{{"Description", "Item " + std::to_string(item)}});
+        }
+        stage.saveHistory = items;
+        stage.frontEnd.resize(40, 8);
+        stage.type("s");
+        (void)draw();
+    }
+    /// The first and the last item that are seen.
+    std::string itemsAfter(Key key) {
+        constexpr std::size_t kNumber = std::string_view("│ ✓ Item ").size();
+        stage.press(key);
+        return stage.line(1).substr(kNumber, 1) + "-" + stage.line(4).substr(kNumber, 1);
     }
     /// "saved TEXT", "open" or "closed", after what was posted has run.
     std::string outcome() {
@@ -138,14 +157,8 @@ TEST_F(FrontEndModalTest, TheDescriptionIsKeptWhileTheFocusGoesAround) {
 }
 
 TEST_F(FrontEndModalTest, AListLongerThanTheRoomIsCutAtItsEnd) {
-    stage.closeSaveScreen();
-    Array items;
-    for (int item = 0; item < 9; ++item) {
-        items.emplace_back(Dictionary{{"Description", "Item " + std::to_string(item)}});
-    }
-    stage.saveHistory = items;
-    stage.type("s");
-    EXPECT_EQ(stage.screen(40, 8), R"(
+    openNineItems();
+    EXPECT_EQ(stage.screen(), R"(
 ┌ Save snapshot ───────────────────────┐
 │ ✓ Item 0                             │
 │ ✓ Item 1                             │
@@ -155,6 +168,30 @@ TEST_F(FrontEndModalTest, AListLongerThanTheRoomIsCutAtItsEnd) {
 │                  [ Save ] [ Cancel ] │
 └──────────────────────────────────────┘
 )");
+}
+
+TEST_F(FrontEndModalTest, PgDnAndPgUpScrollALongListByAPageEach) {
+    openNineItems();
+    EXPECT_EQ(itemsAfter(Key::PageDown), "3-6");
+    EXPECT_EQ(itemsAfter(Key::PageDown), "5-8");
+    EXPECT_EQ(itemsAfter(Key::PageDown), "5-8");
+    EXPECT_EQ(itemsAfter(Key::PageUp), "2-5");
+    EXPECT_EQ(itemsAfter(Key::PageUp), "0-3");
+    EXPECT_TRUE(draw().cursor().has_value()); // the description is edited all the while
+}
+
+TEST_F(FrontEndModalTest, TheWheelScrollsALongList) {
+    openNineItems();
+    EXPECT_EQ(itemsAfter(Key::WheelDown), "3-6");
+    EXPECT_EQ(itemsAfter(Key::WheelDown), "5-8");
+    EXPECT_EQ(itemsAfter(Key::WheelUp), "2-5");
+}
+
+TEST_F(FrontEndModalTest, AListThatFitsDoesNotScroll) {
+    const std::string before = stage.screen();
+    stage.press(Key::PageDown);
+    stage.press(Key::WheelDown);
+    EXPECT_EQ(stage.screen(), before);
 }
 
 TEST_F(FrontEndModalTest, ATickBelowTheSaveScreenLeavesItAlone) {

@@ -65,6 +65,21 @@ TEST_F(TerminalTableTest, TheWindowFollowsTheCursorAndBothStopAtTheEnds) {
     EXPECT_EQ(window(), "[A] B C ");
 }
 
+TEST_F(TerminalTableTest, ScrollingMovesTheWindowAndTheCursorOnlyWithIt) {
+    table.scroll(1);
+    EXPECT_EQ(window(), "[B] C D ");
+    table.moveCursor(1);
+    table.scroll(-1);
+    EXPECT_EQ(window(), "A B [C] ");
+    table.scroll(9);
+    EXPECT_EQ(window(), "[C] D E ");
+    table.scroll(-9);
+    EXPECT_EQ(window(), "A B [C] ");
+    reload({});
+    table.scroll(1);
+    EXPECT_EQ(table.cursor(), 0U);
+}
+
 TEST_F(TerminalTableTest, GoesToARowAndToTheEnd) {
     table.moveToEnd();
     EXPECT_EQ(window(), "C D [E] ");
