@@ -33,6 +33,7 @@ Grid FrontEnd::draw() {
         drawTooSmall(grid);
         return grid;
     }
+    endFilterOfOtherPane();
     const LineEditor* editor = _filterEditor ? &*_filterEditor : nullptr;
     PaneView(grid, _marks, _hits).draw(*navigation, {_spinnerTurn, editor, _message, _note});
     if (const auto& modal = navigation->modal()) {
@@ -77,6 +78,7 @@ void FrontEnd::handle(const KeyEvent& event) {
         return;
     }
     _message.reset();
+    endFilterOfOtherPane();
     // A copy, for the screen may be closed by what it does.
     const std::shared_ptr<ui::ModalScreen> modal = navigation->modal();
     if (_toolkit.alert() != nullptr) {
@@ -322,7 +324,14 @@ void FrontEnd::startFilter(TerminalTable& table) {
     LineEditor editor;
     editor.setText(table.filter());
     _filterEditor = std::move(editor);
+    _filteredPane = _toolkit.navigation()->screens().back();
     needsDisplay();
+}
+
+void FrontEnd::endFilterOfOtherPane() {
+    if (_filteredPane.lock() != _toolkit.navigation()->screens().back()) {
+        _filterEditor.reset();
+    }
 }
 
 } // namespace pallax::terminal

@@ -9,6 +9,7 @@
 #include "ui/terminal/TerminalToolkit.h"
 
 #include <functional>
+#include <memory>
 #include <optional>
 #include <string>
 
@@ -60,6 +61,8 @@ private:
     void save();
     void copyValue(TerminalTable& table);
     void startFilter(TerminalTable& table);
+    /// The typing of a filter ends with another pane on top, by a click or because its own is gone.
+    void endFilterOfOtherPane();
     /// The topmost pane's table; null while nothing is shown.
     TerminalTable* table() const;
 
@@ -71,7 +74,8 @@ private:
     bool _isHelpShown = false;
     int _helpFirst = 0;
     int _helpRows = 0;
-    std::optional<LineEditor> _filterEditor; ///< while a filter is being typed
+    std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
+    std::weak_ptr<ui::TableScreen> _filteredPane; ///< whose it is
     std::optional<std::string> _message;
     std::string _note;
     std::size_t _spinnerTurn = 0;

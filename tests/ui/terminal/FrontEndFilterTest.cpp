@@ -150,6 +150,34 @@ TEST_F(FrontEndFilterTest, NewDataIsFilteredAndTheCursorStaysOnItsRow) {
 )");
 }
 
+TEST_F(FrontEndFilterTest, TypingEndsWhenAClickOpensAnotherPane) {
+    stage.press(Key::Left);
+    stage.type("/info");
+    stage.click(5, 2);
+    EXPECT_EQ(stage.screen(20, 5), R"(
+ Pallax › SIM Info
+ ──────────────────
+▌IMSI     0010101…
+ ──────────────────
+ Updated 2023-11-14
+)");
+    EXPECT_EQ(draw().cursor(), std::nullopt);
+    stage.type("q");
+    EXPECT_EQ(stage.depth(), 1U);
+    EXPECT_EQ(stage.table().filter(), "info"); // kept, but not typed any more
+    EXPECT_EQ(stage.line(4), " Updated 2023-11-14");
+}
+
+TEST_F(FrontEndFilterTest, TypingEndsWhenItsPaneIsGone) {
+    stage.type("/rs");
+    stage.tick(Dictionary{{"A", "1"}, {"B", "2"}});
+    ASSERT_EQ(stage.depth(), 1U);
+    stage.type("j");
+    EXPECT_EQ(stage.table().filter(), "");
+    EXPECT_EQ(stage.cursorName(), "B");
+    EXPECT_EQ(draw().cursor(), std::nullopt);
+}
+
 TEST_F(FrontEndFilterTest, EveryPaneHasItsOwnFilter) {
     stage.press(Key::Left);
     stage.type("/cell");
