@@ -41,6 +41,7 @@ Grid FrontEnd::draw() {
     }
     if (_isHelpShown) {
         _helpRows = drawHelp(grid, _marks, _helpFirst);
+        _helpFirst = std::min(_helpFirst, lastHelpFirst()); // there may be more room than before
     }
     if (const ui::Alert* alert = _toolkit.alert()) {
         drawAlert(grid, _marks, *alert);
@@ -123,10 +124,13 @@ void FrontEnd::handleAlert(const KeyEvent& event) {
     }
 }
 
+int FrontEnd::lastHelpFirst() const {
+    return std::max(static_cast<int>(helpLines().size()) - _helpRows, 0);
+}
+
 /// The arrows scroll where the page does not fit; any other key closes it.
 void FrontEnd::handleHelp(const KeyEvent& event) {
-    const int last = std::max(static_cast<int>(helpLines().size()) - _helpRows, 0);
-    if (event.key == Key::Down && _helpFirst < last) {
+    if (event.key == Key::Down && _helpFirst < lastHelpFirst()) {
         ++_helpFirst;
     } else if (event.key == Key::Up && _helpFirst > 0) {
         --_helpFirst;

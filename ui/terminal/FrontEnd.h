@@ -50,6 +50,8 @@ private:
     void handleMouse(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
     void handleHelp(const KeyEvent& event);
+    /// The line at which the help page begins when it is scrolled to its end.
+    int lastHelpFirst() const;
     void handleModal(ui::ModalScreen& screen, const KeyEvent& event);
     void handleFilter(TerminalTable& table, const KeyEvent& event);
     void handlePane(const KeyEvent& event);
@@ -73,7 +75,7 @@ private:
     ModalFocus _modalFocus = ModalFocus::Save;
     bool _isHelpShown = false;
     int _helpFirst = 0;
-    int _helpRows = 0;
+    int _helpRows = 0;                            ///< that fitted at the last drawing
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
     std::weak_ptr<ui::TableScreen> _filteredPane; ///< whose it is
     std::optional<std::string> _message;

@@ -55,8 +55,9 @@ int drawHelp(Grid& grid, const Marks& marks, int first) {
         centeredBox(grid, columns + kFrameColumns, static_cast<int>(lines.size()) + kFrameRows);
     drawBox(grid, marks, box, "Keys");
     const int shown = box.rows - kFrameRows;
+    const int begin = std::min(first, std::max(static_cast<int>(lines.size()) - shown, 0));
     for (int row = 0; row < shown; ++row) {
-        const auto index = static_cast<std::size_t>(first + row);
+        const auto index = static_cast<std::size_t>(begin + row);
         if (index < lines.size()) {
             grid.put(box.inside().left, box.y + 1 + row, lines[index], {}, box.inside());
         }

@@ -84,6 +84,26 @@ TEST_F(FrontEndHelpTest, TheArrowsScrollItWhereItDoesNotFit) {
     EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
 }
 
+TEST_F(FrontEndHelpTest, ScrolledToItsEndItFillsAScreenThatGrows) {
+    stage.type("?");
+    const std::string fromTheFirstLine = stage.screen(80, 24);
+    stage.frontEnd.resize(20, 5);
+    (void)draw();
+    stage.press(Key::Down, 50);
+    EXPECT_EQ(stage.screen(20, 7), R"(
+┌ Keys ────────────┐
+│ y                │
+│ Ctrl-L           │
+│ Ctrl-Z           │
+│ ?                │
+│ q                │
+└──────────────────┘
+)");
+    stage.press(Key::Up); // scrolls at once
+    EXPECT_EQ(stage.line(1), "│ s                │");
+    EXPECT_EQ(stage.screen(80, 24), fromTheFirstLine);
+}
+
 TEST_F(FrontEndHelpTest, TheArrowsDoNothingWhereItFits) {
     stage.type("?");
     const std::string before = stage.screen(80, 24);
