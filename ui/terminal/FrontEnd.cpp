@@ -82,6 +82,9 @@ void FrontEnd::handle(const KeyEvent& event) {
     endFilterOfOtherPane();
     // A copy, for the screen may be closed by what it does.
     const std::shared_ptr<ui::ModalScreen> modal = navigation->modal();
+    if (!modal) {
+        _modalFocus = ModalFocus::Save; // of the next one to be opened
+    }
     if (_toolkit.alert() != nullptr) {
         handleAlert(event);
     } else if (_isHelpShown) {

@@ -124,6 +124,19 @@ TEST_F(FrontEndModalTest, UpAndDownGoTheSameWay) {
     EXPECT_EQ(focusAfter(Key::Up), "Cancel");
 }
 
+TEST_F(FrontEndModalTest, AnotherSaveScreenRemembersNothingOfTheOneBefore) {
+    stage.type("text");
+    stage.press(Key::BackTab);
+    ASSERT_EQ(focus(), "Cancel");
+    stage.press(Key::Enter);
+    ASSERT_EQ(outcome(), "closed");
+    stage.type("s");
+    EXPECT_EQ(stage.line(6), "│ Description                          │");
+    EXPECT_EQ(focus(), "Description");
+    stage.click(0, 11); // ends editing
+    EXPECT_EQ(focus(), "Save");
+}
+
 TEST_F(FrontEndModalTest, LeftAndRightChangeBetweenTheButtons) {
     stage.press(Key::Enter);
     EXPECT_EQ(focusAfter(Key::Right), "Cancel");
