@@ -78,7 +78,10 @@ void FrontEnd::handle(const KeyEvent& event) {
         _surroundings.repaint();
         return;
     }
-    _message.reset();
+    if (_message) {
+        _message.reset();
+        _surroundings.needsDisplay(); // what a click would do is still the same
+    }
     endFilterOfOtherPane();
     // A copy, for the screen may be closed by what it does.
     const std::shared_ptr<ui::ModalScreen> modal = navigation->modal();

@@ -171,6 +171,17 @@ TEST_F(FrontEndBrowsingTest, YCopiesTheValueAndSaysSoUntilTheNextKey) {
               " Updated 2023-11-14 at 22:13:20                        / filter  s Save  ? help");
 }
 
+TEST_F(FrontEndBrowsingTest, AMessageGoesAtAnyKeyAndTheKeyStillDoesItsOwn) {
+    stage.frontEnd.setMessage("Saved");
+    const int displays = stage.displays;
+    stage.press(Key::Tab); // which does nothing by itself
+    EXPECT_EQ(stage.displays, displays + 1);
+    EXPECT_EQ(stage.screen().find("Saved"), std::string::npos);
+    stage.frontEnd.setMessage("Saved");
+    stage.click(5, 2);
+    EXPECT_EQ(stage.depth(), 2U);
+}
+
 TEST_F(FrontEndBrowsingTest, YOnABranchCopiesItsName) {
     stage.type("y");
     EXPECT_EQ(stage.copied, (std::vector<std::string>{"Serving Cell Measurements"}));
