@@ -37,6 +37,7 @@ const std::vector<std::string_view>& helpLines() {
         "/                 filter rows by name or value",
         "s                 save a snapshot",
         "y                 copy the value",
+        "Tab               next field of the save screen",
         "Ctrl-L            draw the screen again",
         "Ctrl-Z            suspend; fg comes back",
         "?                 this help",

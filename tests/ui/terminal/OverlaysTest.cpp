@@ -109,6 +109,7 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ /                 filter rows by name or value  │
 │ s                 save a snapshot               │
 │ y                 copy the value                │
+│ Tab               next field of the save screen │
 │ Ctrl-L            draw the screen again         │
 │ Ctrl-Z            suspend; fg comes back        │
 │ ?                 this help                     │
