@@ -58,9 +58,10 @@ int drawHelp(Grid& grid, const Marks& marks, int first) {
     const int shown = box.rows - kFrameRows;
     const int begin = std::min(first, std::max(static_cast<int>(lines.size()) - shown, 0));
     for (int row = 0; row < shown; ++row) {
-        const auto index = static_cast<std::size_t>(begin + row);
-        if (index < lines.size()) {
-            grid.put(box.inside().left, box.y + 1 + row, lines[index], {}, box.inside());
+        const int index = begin + row;
+        if (index < static_cast<int>(lines.size())) {
+            const std::string_view line = lines[static_cast<std::size_t>(index)];
+            grid.put(box.inside().left, box.y + 1 + row, line, {}, box.inside());
         }
     }
     return shown;
