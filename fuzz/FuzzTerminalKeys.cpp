@@ -9,7 +9,7 @@
 #include <string>
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-    constexpr std::size_t kLongest = 1024; // each byte may draw a screen
+    constexpr std::size_t kLongest = 256; // each byte may draw a screen
     const std::string fault =
         pallax::terminal::StageScript({data, std::min(size, kLongest)}).play();
     if (!fault.empty()) {

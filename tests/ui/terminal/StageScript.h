@@ -18,6 +18,7 @@ class StageScript {
 public:
     explicit StageScript(std::span<const std::uint8_t> bytes) : _bytes(bytes) {
         _stage.saveHistory = snapshotItems();
+        _stage.frontEnd.resize(kMostColumns / 2, kMostRows / 2);
     }
 
     /// What went wrong; empty when nothing did.
@@ -36,6 +37,9 @@ public:
 
 private:
     static constexpr std::uint8_t kNoDrawing = 0xFF;
+    // Small, for every step draws a screen.
+    static constexpr int kMostColumns = 64;
+    static constexpr int kMostRows = 20;
     static constexpr auto kKeys = std::to_array<Key>(
         {Key::Enter, Key::Escape, Key::Backspace, Key::Delete, Key::Tab, Key::BackTab, Key::Up,
          Key::Down, Key::Left, Key::Right, Key::PageUp, Key::PageDown, Key::Home, Key::End});
@@ -66,8 +70,6 @@ private:
     }
 
     void actBesideKeys(std::uint8_t code) {
-        constexpr int kMostColumns = 100;
-        constexpr int kMostRows = 30;
         switch (code) {
         case 0x90: {
             const int columns = next() % kMostColumns;
