@@ -33,6 +33,7 @@ Grid FrontEnd::draw() {
         drawTooSmall(grid);
         return grid;
     }
+    endFilterOfOtherPane();
     const LineEditor* editor = _filterEditor ? &*_filterEditor : nullptr;
     PaneView(grid, _marks, _hits).draw(*navigation, {_spinnerTurn, editor, _message, _note});
     if (const auto& modal = navigation->modal()) {
@@ -40,6 +41,7 @@ Grid FrontEnd::draw() {
     }
     if (_isHelpShown) {
         _helpRows = drawHelp(grid, _marks, _helpFirst);
+        _helpFirst = std::min(_helpFirst, lastHelpFirst()); // there may be more room than before
     }
     if (const ui::Alert* alert = _toolkit.alert()) {
         drawAlert(grid, _marks, *alert);
@@ -76,9 +78,16 @@ void FrontEnd::handle(const KeyEvent& event) {
         _surroundings.repaint();
         return;
     }
-    _message.reset();
+    if (_message) {
+        _message.reset();
+        _surroundings.needsDisplay(); // what a click would do is still the same
+    }
+    endFilterOfOtherPane();
     // A copy, for the screen may be closed by what it does.
     const std::shared_ptr<ui::ModalScreen> modal = navigation->modal();
+    if (!modal) {
+        _modalFocus = ModalFocus::Save; // of the next one to be opened
+    }
     if (_toolkit.alert() != nullptr) {
         handleAlert(event);
     } else if (_isHelpShown) {
@@ -98,8 +107,11 @@ void FrontEnd::handle(const KeyEvent& event) {
 void FrontEnd::handleMouse(const KeyEvent& event) {
     constexpr std::ptrdiff_t kWheelRows = 3;
     if (event.key != Key::Click) {
-        if (!_toolkit.navigation()->modal()) {
-            table()->moveCursor(event.key == Key::WheelUp ? -kWheelRows : kWheelRows);
+        const std::ptrdiff_t rows = event.key == Key::WheelUp ? -kWheelRows : kWheelRows;
+        if (const auto& modal = _toolkit.navigation()->modal()) {
+            terminalTable(modal->list()).scroll(rows);
+        } else {
+            table()->moveCursor(rows);
         }
         return;
     }
@@ -118,10 +130,13 @@ void FrontEnd::handleAlert(const KeyEvent& event) {
     }
 }
 
+int FrontEnd::lastHelpFirst() const {
+    return std::max(static_cast<int>(helpLines().size()) - _helpRows, 0);
+}
+
 /// The arrows scroll where the page does not fit; any other key closes it.
 void FrontEnd::handleHelp(const KeyEvent& event) {
-    const int last = std::max(static_cast<int>(helpLines().size()) - _helpRows, 0);
-    if (event.key == Key::Down && _helpFirst < last) {
+    if (event.key == Key::Down && _helpFirst < lastHelpFirst()) {
         ++_helpFirst;
     } else if (event.key == Key::Up && _helpFirst > 0) {
         --_helpFirst;
@@ -139,7 +154,7 @@ void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
     }
     if (event.key == Key::PageUp || event.key == Key::PageDown) {
         TerminalTable& list = terminalTable(screen.list());
-        list.moveCursor(event.key == Key::PageUp ? -list.page() : list.page());
+        list.scroll(event.key == Key::PageUp ? -list.page() : list.page());
         return;
     }
     const bool forwards = event.key == Key::Tab || event.key == Key::Down;
@@ -319,7 +334,14 @@ void FrontEnd::startFilter(TerminalTable& table) {
     LineEditor editor;
     editor.setText(table.filter());
     _filterEditor = std::move(editor);
+    _filteredPane = _toolkit.navigation()->screens().back();
     needsDisplay();
+}
+
+void FrontEnd::endFilterOfOtherPane() {
+    if (_filteredPane.lock() != _toolkit.navigation()->screens().back()) {
+        _filterEditor.reset();
+    }
 }
 
 } // namespace pallax::terminal

@@ -9,6 +9,7 @@
 #include "ui/terminal/TerminalToolkit.h"
 
 #include <functional>
+#include <memory>
 #include <optional>
 #include <string>
 
@@ -49,6 +50,8 @@ private:
     void handleMouse(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
     void handleHelp(const KeyEvent& event);
+    /// The line at which the help page begins when it is scrolled to its end.
+    int lastHelpFirst() const;
     void handleModal(ui::ModalScreen& screen, const KeyEvent& event);
     void handleFilter(TerminalTable& table, const KeyEvent& event);
     void handlePane(const KeyEvent& event);
@@ -60,6 +63,8 @@ private:
     void save();
     void copyValue(TerminalTable& table);
     void startFilter(TerminalTable& table);
+    /// The typing of a filter ends with another pane on top, by a click or because its own is gone.
+    void endFilterOfOtherPane();
     /// The topmost pane's table; null while nothing is shown.
     TerminalTable* table() const;
 
@@ -70,8 +75,9 @@ private:
     ModalFocus _modalFocus = ModalFocus::Save;
     bool _isHelpShown = false;
     int _helpFirst = 0;
-    int _helpRows = 0;
-    std::optional<LineEditor> _filterEditor; ///< while a filter is being typed
+    int _helpRows = 0;                            ///< that fitted at the last drawing
+    std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
+    std::weak_ptr<ui::TableScreen> _filteredPane; ///< whose it is
     std::optional<std::string> _message;
     std::string _note;
     std::size_t _spinnerTurn = 0;

@@ -47,9 +47,7 @@ void Grid::fill(Span span, int y, std::string_view text, Style style) {
 }
 
 void Grid::set(int x, int y, std::string text, Style style) {
-    if (!text.empty()) {
-        separateWideCharacterAt(x, y);
-    }
+    separateWideCharacterAt(x, y);
     _cells[index(x, y)] = {std::move(text), style};
 }
 

@@ -82,7 +82,7 @@ bool LineEditor::insert(char32_t character) {
     appendUtf8(bytes, character);
     if (_text.size() + bytes.size() <= kMaximumBytes) {
         _text.insert(_cursor, bytes);
-        _cursor += bytes.size();
+        _cursor = boundaryFrom(_cursor + bytes.size());
     }
     return true;
 }
@@ -103,6 +103,17 @@ std::size_t LineEditor::before() const {
 std::size_t LineEditor::after() const {
     const auto clusters = clustersOf(std::string_view(_text).substr(_cursor));
     return clusters.empty() ? _cursor : _cursor + clusters.front().bytes;
+}
+
+/// What is typed before a combining character that stood on its own takes it along.
+std::size_t LineEditor::boundaryFrom(std::size_t offset) const {
+    for (const Cluster& cluster : clustersOf(_text)) {
+        const std::size_t end = cluster.offset + cluster.bytes;
+        if (end >= offset) {
+            return end;
+        }
+    }
+    return _text.size();
 }
 
 std::size_t LineEditor::wordStart() const {

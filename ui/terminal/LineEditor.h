@@ -31,6 +31,8 @@ private:
     void erase(std::size_t from, std::size_t to);
     std::size_t before() const;
     std::size_t after() const;
+    /// The first boundary between characters at or behind `offset`.
+    std::size_t boundaryFrom(std::size_t offset) const;
     std::size_t wordStart() const;
 
     std::string _text;

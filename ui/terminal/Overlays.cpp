@@ -37,6 +37,7 @@ const std::vector<std::string_view>& helpLines() {
         "/                 filter rows by name or value",
         "s                 save a snapshot",
         "y                 copy the value",
+        "Tab               next field of the save screen",
         "Ctrl-L            draw the screen again",
         "Ctrl-Z            suspend; fg comes back",
         "?                 this help",
@@ -55,10 +56,12 @@ int drawHelp(Grid& grid, const Marks& marks, int first) {
         centeredBox(grid, columns + kFrameColumns, static_cast<int>(lines.size()) + kFrameRows);
     drawBox(grid, marks, box, "Keys");
     const int shown = box.rows - kFrameRows;
+    const int begin = std::min(first, std::max(static_cast<int>(lines.size()) - shown, 0));
     for (int row = 0; row < shown; ++row) {
-        const auto index = static_cast<std::size_t>(first + row);
-        if (index < lines.size()) {
-            grid.put(box.inside().left, box.y + 1 + row, lines[index], {}, box.inside());
+        const int index = begin + row;
+        if (index < static_cast<int>(lines.size())) {
+            const std::string_view line = lines[static_cast<std::size_t>(index)];
+            grid.put(box.inside().left, box.y + 1 + row, line, {}, box.inside());
         }
     }
     return shown;

@@ -14,7 +14,8 @@ void drawAlert(Grid& grid, const Marks& marks, const ui::Alert& alert);
 /// The help page's lines: every key and what it does.
 const std::vector<std::string_view>& helpLines();
 
-/// The help page from line `first` on; how many lines it shows at once is returned.
+/// The help page from line `first` on, or from the last line at which it fills its box; how many
+/// lines it shows at once is returned.
 int drawHelp(Grid& grid, const Marks& marks, int first);
 
 /// The least extent in which the screens can be drawn.

@@ -54,6 +54,26 @@ std::string breadcrumbs(const TerminalNavigation& navigation, const Marks& marks
     return path;
 }
 
+/// Bytes [begin, end) of a text.
+struct Range {
+    std::size_t begin = 0;
+    std::size_t end = 0;
+};
+
+/// A range of `text` widened to whole characters, each with the combining ones that follow it.
+Range wholeCharacters(std::string_view text, Range range) {
+    Range whole = range;
+    for (const Cluster& cluster : clustersOf(text)) {
+        if (cluster.offset <= range.begin) {
+            whole.begin = cluster.offset;
+        }
+        if (cluster.offset < range.end) {
+            whole.end = cluster.offset + cluster.bytes;
+        }
+    }
+    return whole;
+}
+
 } // namespace
 
 bool isLoading(const ui::BarItems& items) {
@@ -118,7 +138,10 @@ void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y) {
 void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const ui::RowText& row,
                         int y, bool isSelected) {
     const ui::CellContents contents = cell.contents();
-    const int width = columnOf(cell.contentBounds().size.width);
+    const std::string count = row.elements ? std::to_string(*row.elements) : "";
+    // A count stands at the end of the room for texts, behind a blank.
+    const int width =
+        columnOf(cell.contentBounds().size.width) - (count.empty() ? 0 : columnsOf(count) + 1);
     int offset = 0;
     if (contents.container != nullptr) {
         const int beyond = columnOf(contents.container->contentSize.width) -
@@ -140,10 +163,7 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const u
     const int last = _grid.columns() - 1;
     if (cell.accessory() == ui::CellAccessory::DisclosureIndicator) {
         _grid.put(last, y, _marks.disclosure, {.accent = isSelected});
-        if (row.elements) {
-            const std::string count = std::to_string(*row.elements);
-            _grid.put(last - 1 - columnsOf(count), y, count, kDim);
-        }
+        _grid.put(last - 1 - columnsOf(count), y, count, kDim);
     } else if (row.hasChanged) {
         _grid.put(last, y, _marks.changed, kBold);
     }
@@ -158,11 +178,12 @@ void PaneView::drawLabel(const ui::Label& label, int x, int y, Style style, Span
         _grid.put(x, y, text, style, clip);
         return;
     }
+    const Range found = wholeCharacters(text, {match, match + filter.size()});
     Style underlined = style;
     underlined.underline = true;
-    x = _grid.put(x, y, text.substr(0, match), style, clip);
-    x = _grid.put(x, y, text.substr(match, filter.size()), underlined, clip);
-    _grid.put(x, y, text.substr(match + filter.size()), style, clip);
+    x = _grid.put(x, y, text.substr(0, found.begin), style, clip);
+    x = _grid.put(x, y, text.substr(found.begin, found.end - found.begin), underlined, clip);
+    _grid.put(x, y, text.substr(found.end), style, clip);
 }
 
 void PaneView::drawToolbar(const TerminalNavigation& navigation, const TerminalTable& table,

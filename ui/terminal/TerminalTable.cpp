@@ -61,6 +61,9 @@ void TerminalTable::setViewport(std::size_t rows, ui::Rect contentBounds) {
         _contentBounds = contentBounds;
         _sidewaysOffset = 0;
     }
+    if (!_cursorName) {
+        rememberCursor(); // of a table that was never reloaded
+    }
     keepCursorInWindow();
 }
 
@@ -93,6 +96,13 @@ void TerminalTable::moveCursorTo(std::size_t shown) {
     _needsDisplay();
 }
 
+void TerminalTable::scroll(std::ptrdiff_t rows) {
+    const auto last = static_cast<std::ptrdiff_t>(lastFirstShown());
+    const auto target = static_cast<std::ptrdiff_t>(_firstShown) + rows;
+    _firstShown = static_cast<std::size_t>(std::clamp<std::ptrdiff_t>(target, 0, last));
+    moveCursorTo(std::clamp(_cursor, _firstShown, _firstShown + _windowRows - 1));
+}
+
 std::ptrdiff_t TerminalTable::page() const {
     return static_cast<std::ptrdiff_t>(std::max<std::size_t>(_windowRows, 2) - 1);
 }
@@ -117,11 +127,11 @@ bool TerminalTable::scrollSideways(int columns) {
     }
     const int beyond =
         columnOf(std::max(container->contentSize.width - container->frame.size.width, 0.0));
-    const int offset = std::clamp(_sidewaysOffset + columns, 0, beyond);
-    if (offset == _sidewaysOffset) {
+    const int current = std::min(_sidewaysOffset, beyond); // new data may be shorter
+    _sidewaysOffset = std::clamp(current + columns, 0, beyond);
+    if (_sidewaysOffset == current) {
         return false;
     }
-    _sidewaysOffset = offset;
     _needsDisplay();
     return true;
 }
@@ -138,9 +148,11 @@ void TerminalTable::filterRows() {
     }
 }
 
+/// Where there is no row for now, the last one's name is kept: it may come back.
 void TerminalTable::rememberCursor() {
-    const auto row = cursorRow();
-    _cursorName = row ? std::optional(_source.textOfRow(*row).name) : std::nullopt;
+    if (const auto row = cursorRow()) {
+        _cursorName = _source.textOfRow(*row).name;
+    }
 }
 
 /// Mostly the row is where it was. Otherwise the nearest one of that name is taken, and where
@@ -166,10 +178,13 @@ void TerminalTable::findCursor() {
     rememberCursor();
 }
 
-void TerminalTable::keepCursorInWindow() {
+std::size_t TerminalTable::lastFirstShown() const {
     const std::size_t count = shownRows();
-    const std::size_t lastFirst = count > _windowRows ? count - _windowRows : 0;
-    _firstShown = std::min(_firstShown, lastFirst);
+    return count > _windowRows ? count - _windowRows : 0;
+}
+
+void TerminalTable::keepCursorInWindow() {
+    _firstShown = std::min(_firstShown, lastFirstShown());
     if (_cursor < _firstShown) {
         _firstShown = _cursor;
     } else if (_cursor >= _firstShown + _windowRows) {

@@ -45,6 +45,8 @@ public:
     /// Moves by so many rows, stopping at the ends.
     void moveCursor(std::ptrdiff_t rows);
     void moveCursorTo(std::size_t shown);
+    /// Moves the window by so many rows, stopping at the ends; the cursor stays inside it.
+    void scroll(std::ptrdiff_t rows);
     /// A window's height, less one row.
     std::ptrdiff_t page() const;
     void moveToEnd() { moveCursorTo(shownRows()); }
@@ -65,6 +67,8 @@ private:
     void filterRows();
     void rememberCursor();
     void findCursor();
+    /// The last row at which a window can begin without room below its rows.
+    std::size_t lastFirstShown() const;
     void keepCursorInWindow();
 
     ui::TableSource& _source;
@@ -73,7 +77,7 @@ private:
     std::size_t _windowRows = 1;
     std::size_t _firstShown = 0;
     std::size_t _cursor = 0;
-    std::optional<std::string> _cursorName; // of the row under the cursor
+    std::optional<std::string> _cursorName; // of the row under the cursor, or the last one there
     std::string _filter;
     std::vector<std::size_t> _matches; // the rows that pass, while there is a filter
     int _sidewaysOffset = 0;

@@ -82,7 +82,10 @@ std::unique_ptr<ui::TableView> TerminalToolkit::makeTableView(ui::TableSource& s
 
 /// There is one layout, whatever its name: a list, the field, and the two buttons.
 ui::ModalOutlets TerminalToolkit::loadLayout(std::string_view /*name*/, ui::TableSource& source) {
-    return {makeTableView(source), std::make_unique<TerminalTextField>(_needsDisplay)};
+    ui::ModalOutlets outlets;
+    outlets.list = makeTableView(source);
+    outlets.field = std::make_unique<TerminalTextField>(_needsDisplay);
+    return outlets;
 }
 
 void TerminalToolkit::showAlert(const ui::Alert& alert) {

@@ -5,7 +5,7 @@
 #include <algorithm>
 #include <clocale>
 #include <cwchar>
-#include <locale.h>
+#include <locale.h> // NOLINT(modernize-deprecated-headers): POSIX has more in it than C
 #include <utility>
 
 namespace pallax::terminal {

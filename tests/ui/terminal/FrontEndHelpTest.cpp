@@ -1,0 +1,193 @@
+#include "tests/ui/terminal/StageFixture.h"
+#include "ui/terminal/Overlays.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <sstream>
+#include <string>
+
+namespace pallax::terminal {
+namespace {
+
+class FrontEndHelpTest : public StageFixture {
+protected:
+    FrontEndHelpTest() {
+        stage.tick(display());
+        stage.press(Key::Enter);
+    }
+    bool isOpen() { return stage.screen(40, 12).find("┌ Keys") != std::string::npos; }
+};
+
+TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
+    stage.type("?");
+    EXPECT_EQ(stage.screen(80, 24), R"(
+ Pallax › Serving Cell Measurements
+ ──────────────────────────────────────────────────────────────────────────────
+▌Version                                                                     1
+ E-ARFCN      ┌ Keys ───────────────────────────────────────────┐         1850
+ Physical Cell│ Up Down  k j      one row up or down            │          274
+ Measured RSRP│ PgUp PgDn         one page up or down           │   -94.75 dBm
+ Average RSRP │ Home End  g G     first or last row             │   -95.00 dBm
+ Measured RSRQ│ Enter Right l     open the row                  │     -9.50 dB
+              │ Right Left        scroll a long row             │
+              │ Left h Backspace  back                          │
+              │ Esc               clear the filter, or back     │
+              │ /                 filter rows by name or value  │
+              │ s                 save a snapshot               │
+              │ y                 copy the value                │
+              │ Tab               next field of the save screen │
+              │ Ctrl-L            draw the screen again         │
+              │ Ctrl-Z            suspend; fg comes back        │
+              │ ?                 this help                     │
+              │ q                 back; at the first pane, quit │
+              └─────────────────────────────────────────────────┘
+
+
+ ──────────────────────────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20                        / filter  s Save  ? help
+)");
+    EXPECT_EQ(stage.screen(40, 12), R"(
+┌ Keys ────────────────────────────────┐
+│ Up Down  k j      one row up or down │
+│ PgUp PgDn         one page up or dow │
+│ Home End  g G     first or last row  │
+│ Enter Right l     open the row       │
+│ Right Left        scroll a long row  │
+│ Left h Backspace  back               │
+│ Esc               clear the filter,  │
+│ /                 filter rows by nam │
+│ s                 save a snapshot    │
+│ y                 copy the value     │
+└──────────────────────────────────────┘
+)");
+    EXPECT_EQ(stage.screen(20, 5), R"(
+┌ Keys ────────────┐
+│ Up Down  k j     │
+│ PgUp PgDn        │
+│ Home End  g G    │
+└──────────────────┘
+)");
+}
+
+TEST_F(FrontEndHelpTest, TheArrowsScrollItWhereItDoesNotFit) {
+    stage.type("?");
+    stage.frontEnd.resize(20, 5);
+    (void)stage.frontEnd.draw();
+    stage.press(Key::Down);
+    EXPECT_EQ(stage.line(1), "│ PgUp PgDn        │");
+    stage.press(Key::Down, 50);
+    EXPECT_EQ(stage.line(3), "│ q                │");
+    stage.press(Key::Up);
+    EXPECT_EQ(stage.line(3), "│ ?                │");
+    stage.press(Key::Up, 50);
+    EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
+}
+
+TEST_F(FrontEndHelpTest, ScrolledToItsEndItFillsAScreenThatGrows) {
+    stage.type("?");
+    const std::string fromTheFirstLine = stage.screen(80, 24);
+    stage.frontEnd.resize(20, 5);
+    (void)draw();
+    stage.press(Key::Down, 50);
+    EXPECT_EQ(stage.screen(20, 7), R"(
+┌ Keys ────────────┐
+│ Tab              │
+│ Ctrl-L           │
+│ Ctrl-Z           │
+│ ?                │
+│ q                │
+└──────────────────┘
+)");
+    stage.press(Key::Up); // scrolls at once
+    EXPECT_EQ(stage.line(1), "│ y                │");
+    EXPECT_EQ(stage.screen(80, 24), fromTheFirstLine);
+}
+
+TEST_F(FrontEndHelpTest, TheArrowsDoNothingWhereItFits) {
+    stage.type("?");
+    const std::string before = stage.screen(80, 24);
+    stage.press(Key::Down);
+    EXPECT_EQ(stage.screen(), before);
+    stage.press(Key::Up);
+    EXPECT_EQ(stage.screen(), before);
+}
+
+TEST_F(FrontEndHelpTest, AnyOtherKeyClosesItAndDoesNothingElse) {
+    stage.type("?");
+    stage.type("q");
+    EXPECT_FALSE(isOpen());
+    stage.type("?");
+    stage.press(Key::Escape);
+    EXPECT_FALSE(isOpen());
+    stage.type("??");
+    EXPECT_FALSE(isOpen());
+    stage.type("?");
+    stage.click(3, 3);
+    EXPECT_FALSE(isOpen());
+    stage.type("?s");
+    EXPECT_FALSE(isOpen());
+    EXPECT_EQ(stage.saveScreen(), nullptr);
+    EXPECT_EQ(stage.depth(), 2U);
+    EXPECT_EQ(stage.cursorName(), "Version");
+}
+
+TEST_F(FrontEndHelpTest, ControlLLeavesItOpen) {
+    stage.type("?");
+    stage.pressControl('l');
+    EXPECT_TRUE(isOpen());
+    EXPECT_EQ(stage.repaints, 1);
+}
+
+TEST_F(FrontEndHelpTest, ItOpensAtItsFirstLineAgain) {
+    stage.frontEnd.resize(20, 5);
+    stage.type("?");
+    (void)stage.frontEnd.draw();
+    stage.press(Key::Down, 3);
+    stage.type("q?");
+    EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
+}
+
+/// The words of the help page's left column.
+std::vector<std::string> namedKeys() {
+    constexpr std::size_t kColumn = 18;
+    std::vector<std::string> names;
+    for (const std::string_view line : helpLines()) {
+        std::istringstream words{std::string(line.substr(0, kColumn))};
+        for (std::string word; words >> word;) {
+            names.push_back(word);
+        }
+    }
+    return names;
+}
+
+TEST_F(FrontEndHelpTest, EveryKeyIsNamed) {
+    const std::vector<std::string> names = namedKeys();
+    for (const char* key :
+         {"Up",        "Down", "PgUp", "PgDn", "Home",   "End",    "Enter", "Right", "Left",
+          "Backspace", "Esc",  "h",    "j",    "k",      "l",      "g",     "G",     "/",
+          "s",         "y",    "?",    "q",    "Ctrl-L", "Ctrl-Z", "Tab"}) {
+        EXPECT_NE(std::find(names.begin(), names.end(), key), names.end()) << key;
+    }
+}
+
+TEST_F(FrontEndHelpTest, EveryCharacterThatDoesSomethingIsNamed) {
+    const std::vector<std::string> names = namedKeys();
+    for (char character = ' '; character < 0x7F; ++character) {
+        TerminalStage fresh;
+        fresh.tick(display());
+        fresh.press(Key::Enter);
+        fresh.press(Key::Down);
+        (void)fresh.frontEnd.draw();
+        const int displays = fresh.displays;
+        const std::string name(1, character);
+        fresh.type(name);
+        const bool didSomething = fresh.displays != displays;
+        const bool isNamed = std::find(names.begin(), names.end(), name) != names.end();
+        // Where it would scroll or open, 'l' finds nothing to do on this row.
+        EXPECT_EQ(didSomething || character == 'l', isNamed) << name;
+    }
+}
+
+} // namespace
+} // namespace pallax::terminal

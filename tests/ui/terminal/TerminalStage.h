@@ -1,0 +1,148 @@
+#pragma once
+
+#include "app/PallaxPaneController.h"
+#include "app/PallaxSaveViewController.h"
+#include "app/tree/PallaxModelNode.h"
+#include "platform/Utf8.h"
+#include "platform/ui/Window.h"
+#include "tests/doubles/FakeFileSystem.h"
+#include "tests/doubles/ManualClock.h"
+#include "tests/doubles/SteppedQueue.h"
+#include "ui/terminal/FrontEnd.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace pallax::terminal {
+
+/// The terminal front end with the application's own panes and save screen, showing a display
+/// that the test sets. What the front end asks of its surroundings is counted.
+class TerminalStage final : public PaneApplication, public ui::NavigationDelegate {
+public:
+    explicit TerminalStage(const Marks& marks = kUtf8Marks)
+        : frontEnd({[this] { ++displays; }, [this] { ++quits; },
+                    [this](const std::string& text) { copied.push_back(text); },
+                    [this] { ++repaints; }},
+                   marks),
+          _window(frontEnd.toolkit().makeWindow({})) {
+        auto root = std::make_shared<PallaxPaneController>(frontEnd.toolkit(), *this, nullptr, "/");
+        root->setStatus("Connecting", true);
+        _stack = frontEnd.toolkit().makeNavigationStack(std::move(root));
+        _stack->setDelegate(this);
+        _window->setRoot(*_stack);
+        _window->makeKeyAndVisible();
+    }
+
+    FrontEnd frontEnd;
+    int displays = 0;
+    int quits = 0;
+    int repaints = 0;
+    std::vector<std::string> copied;
+
+    bool savingAllowed = true;
+    std::optional<std::string> status; ///< null: as the state of the connection says
+    doubles::FakeFileSystem files;
+    doubles::ManualClock clock;
+    doubles::SteppedQueue queue;
+    PropertyList saveHistory;
+
+    /// New data: every pane is reloaded, or the stack goes back to below the first whose path has
+    /// vanished. A null display is what there is without a connection.
+    void tick(const PropertyList& display) {
+        PathDictionary paths;
+        const NodeRef root = PallaxModelNode::makeTreeFromObject(display, paths);
+        _isConnected = root != nullptr;
+        const auto panes = _stack->screens();
+        for (std::size_t index = 0; index < panes.size(); ++index) {
+            auto& pane = dynamic_cast<PallaxPaneController&>(*panes[index]);
+            const auto found = paths.find(pane.path());
+            if (index > 0 && found == paths.end()) {
+                _stack->popTo(index - 1, true);
+                break;
+            }
+            pane.reloadWithNode(index == 0 ? root : found->second);
+        }
+        showStatus(*_stack->screens().back());
+    }
+
+    void press(Key key) { frontEnd.handle({.key = key}); }
+    void press(Key key, int times) {
+        for (int time = 0; time < times; ++time) {
+            press(key);
+        }
+    }
+    /// Presses the keys of these characters.
+    void type(std::string_view text) {
+        for (std::size_t at = 0; at < text.size();) {
+            const Utf8CodePoint codePoint = utf8At(text, at);
+            frontEnd.handle({.key = Key::Character, .character = codePoint.value});
+            at += codePoint.size;
+        }
+    }
+    void pressControl(char letter) {
+        frontEnd.handle({.key = Key::Character, .character = controlKey(letter)});
+    }
+    void mouse(Key key, int x, int y) { frontEnd.handle({.key = key, .x = x, .y = y}); }
+    /// The screen is drawn first: a click is meant for what is seen.
+    void click(int x, int y) {
+        (void)frontEnd.draw();
+        mouse(Key::Click, x, y);
+    }
+
+    /// The screen as text, behind an empty line, so that it compares to a raw string.
+    std::string screen() { return "\n" + frontEnd.draw().text(); }
+    std::string screen(int columns, int rows) {
+        frontEnd.resize(columns, rows);
+        return screen();
+    }
+    /// One row of it.
+    std::string line(int y) { return frontEnd.draw().lines().at(static_cast<std::size_t>(y)); }
+
+    TerminalTable& table() { return terminalTable(_stack->screens().back()->table()); }
+    /// The name of the row under the cursor.
+    std::string cursorName() {
+        const auto row = table().cursorRow();
+        return row ? table().source().textOfRow(*row).name : "(none)";
+    }
+    std::size_t depth() const { return _stack->screens().size(); }
+    const std::shared_ptr<PallaxSaveViewController>& saveScreen() const { return _saveScreen; }
+    void closeSaveScreen() {
+        _stack->dismissModal(true);
+        _saveScreen = nullptr;
+    }
+
+    // What panes ask of the application.
+    bool allowSaveButton() const override { return savingAllowed; }
+    void showSaveView() override {
+        if (_saveScreen) {
+            return;
+        }
+        _saveScreen = std::make_shared<PallaxSaveViewController>(
+            PallaxSaveViewController::Surroundings{frontEnd.toolkit(), files, clock, queue,
+                                                   "/snapshots", [this] { closeSaveScreen(); }},
+            saveHistory);
+        _stack->presentModal(_saveScreen, true);
+    }
+    ui::NavigationStack* navigationController() override { return _stack.get(); }
+    void navigationControllerWillShow(ui::NavigationStack& /*stack*/, ui::TableScreen& screen,
+                                      bool /*animated*/) override {
+        showStatus(screen);
+    }
+
+private:
+    void showStatus(ui::TableScreen& screen) {
+        const std::string usual = _isConnected ? "Updated 2023-11-14 at 22:13:20" : "Connecting...";
+        dynamic_cast<PallaxPaneController&>(screen).setStatus(status.value_or(usual),
+                                                              !_isConnected);
+    }
+
+    bool _isConnected = false;
+    std::unique_ptr<ui::NavigationStack> _stack;
+    std::unique_ptr<ui::Window> _window; // goes before the stack
+    std::shared_ptr<PallaxSaveViewController> _saveScreen;
+};
+
+} // namespace pallax::terminal
