@@ -107,6 +107,10 @@ ExitStatus browseWithLog(const Request& request) {
         complain(*refusal);
         return kExitFailure;
     }
+    if (recording == "-" && ::isatty(STDIN_FILENO) != 0) {
+        complain("Standard input is a terminal; pipe a recording into it.");
+        return kExitWrongUsage;
+    }
     std::unique_ptr<ChildService> child;
     if (recording) {
         auto started = ChildService::start({*recording, request.options.play});

@@ -81,11 +81,12 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
             ->type_name("");
     app.add_flag("--print", options.print,
                  "Print the tree as text at each display tick, as is done without a terminal");
-    addChoice<terminal::ColorUse>(app, "--color", options.color,
-                                  {{"auto", terminal::ColorUse::Auto},
-                                   {"always", terminal::ColorUse::Always},
-                                   {"never", terminal::ColorUse::Never}},
-                                  "Colour on the screen (default: auto, unless NO_COLOR is set)");
+    addChoice<terminal::ColorUse>(
+        app, "--color", options.color,
+        {{"auto", terminal::ColorUse::Auto},
+         {"always", terminal::ColorUse::Always},
+         {"never", terminal::ColorUse::Never}},
+        "Colour on the screen (default: auto, which is never where NO_COLOR is set)");
     app.add_flag_callback(
         "--no-mouse", [&options] { options.mouse = false; },
         "Leave the mouse to the terminal, so that text can be selected");

@@ -17,9 +17,10 @@ constexpr std::chrono::milliseconds kLookInterval{500};
 } // namespace
 
 bool ScreenBrowser::Files::writePropertyList(const std::string& path, const PropertyList& object) {
+    const bool isReplaced = _files.exists(path);
     const bool isWritten = _files.writePropertyList(path, object);
     if (isWritten) {
-        _frontEnd.setMessage("Saved " + path);
+        _frontEnd.setMessage((isReplaced ? "Replaced " : "Saved ") + path);
     }
     return isWritten;
 }

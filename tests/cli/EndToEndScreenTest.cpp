@@ -8,6 +8,7 @@
 #include <fcntl.h>
 #include <filesystem>
 #include <fstream>
+#include <thread>
 
 namespace pallax {
 namespace {
@@ -330,6 +331,82 @@ TEST_F(EndToEndScreen, ATerminalTypeThatNobodyKnowsGivesOneSentence) {
     EXPECT_TRUE(terminal.shows("pallax: Nothing is known here of the terminal type "
                                "\"no-such-terminal\" (TERM); --\nprint does without.\n"));
     EXPECT_EQ(terminal.wait(), 1);
+}
+
+TEST_F(EndToEndScreen, KeysThatTheTerminalSendsDifferentlyFromItsTypeAreKnown) {
+    PallaxTerminal terminal(world, {brief(), "--speed", "max"}, {.type = "vt100"});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    terminal.type("jj");
+    ASSERT_TRUE(terminal.shows("▌Process CO"));
+    terminal.type("\r");
+    ASSERT_TRUE(terminal.shows("Pallax › Process CO"));
+    terminal.type("\x1b[6~\x1b[1~\x1b[4~"); // a page down, Home, End: nothing goes back
+    terminal.type("\x1b[200~\x1b[I");       // a paste begins, the focus comes: no keys
+    terminal.settled();
+    EXPECT_TRUE(terminal.shows("Pallax › Process CO"));
+    terminal.type(kEscape);
+    EXPECT_TRUE(terminal.showsNoMore("Pallax ›"));
+    terminal.type("q");
+    EXPECT_EQ(terminal.wait(), 0);
+}
+
+TEST_F(EndToEndScreen, AnArrowThatComesInTwoPartsIsNoEscape) {
+    PallaxTerminal terminal(world, {brief(), "--speed", "max"}, {});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    terminal.type("\r");
+    ASSERT_TRUE(terminal.shows("Pallax › Serving PLMN"));
+    terminal.type("\x1b");
+    std::this_thread::sleep_for(milliseconds(50));
+    terminal.type("OB");
+    terminal.settled();
+    EXPECT_TRUE(terminal.shows("Pallax › Serving PLMN"));
+    terminal.type("qq");
+    EXPECT_EQ(terminal.wait(), 0);
+}
+
+TEST_F(EndToEndScreen, InAPlainLocaleADescriptionIsStillUtf8) {
+    PallaxTerminal terminal(world, {brief(), "--speed", "max"}, {.locale = "C"});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    terminal.type("s");
+    ASSERT_TRUE(terminal.shows("Save snapshot"));
+    terminal.type("über x\r\r");
+    ASSERT_TRUE(terminal.shows("Saved "));
+    terminal.type("q");
+    EXPECT_EQ(terminal.wait(), 0);
+    ASSERT_EQ(filesIn(snapshots).size(), 1U);
+    EXPECT_NE(contentOf(filesIn(snapshots)[0]).find("<string>über x</string>"), std::string::npos);
+}
+
+TEST_F(EndToEndScreen, ATerminalIsNoRecording) {
+    PallaxTerminal terminal(world, {"-"}, {});
+    EXPECT_TRUE(terminal.shows("pallax: Standard input is a terminal; pipe a recording into it."));
+    EXPECT_EQ(terminal.wait(), 2);
+}
+
+TEST_F(EndToEndScreen, WithoutAServiceItSaysConnectingAndTheSpinnerTurns) {
+    PallaxTerminal terminal(world, {}, {});
+    EXPECT_TRUE(terminal.shows("⠋ Connecting"));
+    EXPECT_TRUE(terminal.shows("⠹ Connecting"));
+    EXPECT_EQ(terminal.screen().text().find("Connecting..."), std::string::npos);
+    terminal.type("q");
+    EXPECT_EQ(terminal.wait(), 0);
+    EXPECT_TRUE(terminal.isRestored());
+}
+
+TEST_F(EndToEndScreen, ATickClearsNothing) {
+    PallaxTerminal terminal(world, {changing(), "--speed", "8"}, {});
+    ASSERT_TRUE(terminal.shows("Process CO"));
+    terminal.type("/process co\r\r");
+    ASSERT_TRUE(terminal.shows("REG_STATE_INACTIVE"));
+    const std::size_t before = terminal.bytes().size();
+    EXPECT_TRUE(terminal.shows("REG_STATE_REGISTERING"));
+    EXPECT_TRUE(terminal.shows("REG_STATE_INACTIVE"));
+    const std::string since = terminal.bytes().substr(before);
+    EXPECT_EQ(since.find("\x1b[2J"), std::string::npos);
+    EXPECT_EQ(since.find("\x1b[H"), std::string::npos);
+    EXPECT_LT(since.size(), 2000U) << "only what has changed is drawn";
+    terminal.type("qq");
+    EXPECT_EQ(terminal.wait(), 0);
 }
 
 TEST_F(EndToEndScreen, KeysComeFromTheTerminalWhenStandardInputIsTheRecording) {

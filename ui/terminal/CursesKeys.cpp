@@ -29,6 +29,31 @@ constexpr auto kCodes = std::to_array<Code>({
     {KEY_BTAB, Key::BackTab},
 });
 
+struct Sequence {
+    std::string_view parameters;
+    char32_t final;
+    Key key;
+};
+
+/// What xterm, the console and rxvt send, and those that follow them.
+constexpr auto kSequences = std::to_array<Sequence>({
+    {"", U'A', Key::Up},
+    {"", U'B', Key::Down},
+    {"", U'C', Key::Right},
+    {"", U'D', Key::Left},
+    {"", U'H', Key::Home},
+    {"", U'F', Key::End},
+    {"", U'Z', Key::BackTab},
+    {"", U'M', Key::Enter},
+    {"1", U'~', Key::Home},
+    {"7", U'~', Key::Home},
+    {"4", U'~', Key::End},
+    {"8", U'~', Key::End},
+    {"3", U'~', Key::Delete},
+    {"5", U'~', Key::PageUp},
+    {"6", U'~', Key::PageDown},
+});
+
 std::optional<KeyEvent> mouseEvent() {
     MEVENT event{};
     if (::getmouse(&event) != OK) {
@@ -56,6 +81,17 @@ std::optional<KeyEvent> keyOfCode(unsigned code) {
     const auto* found = std::find_if(kCodes.begin(), kCodes.end(),
                                      [code](const Code& known) { return known.code == code; });
     if (found == kCodes.end()) {
+        return std::nullopt;
+    }
+    return KeyEvent{.key = found->key};
+}
+
+std::optional<KeyEvent> keyOfSequence(std::string_view parameters, char32_t final) {
+    const auto* found =
+        std::find_if(kSequences.begin(), kSequences.end(), [&](const Sequence& known) {
+            return known.parameters == parameters && known.final == final;
+        });
+    if (found == kSequences.end()) {
         return std::nullopt;
     }
     return KeyEvent{.key = found->key};

@@ -23,6 +23,9 @@ namespace {
 
 constexpr short kAccentPair = 1;
 
+/// Milliseconds in which an escape sequence is complete, also over a network that stutters.
+constexpr int kEscapeDelay = 100;
+
 /// Opened anew for the keys, even where it is standard input: whoever waits for the descriptor may
 /// make it non-blocking, which is to stay unseen by those who share standard input with us.
 constexpr const char* kControllingTerminal = "/dev/tty";
@@ -46,6 +49,33 @@ std::string restoringSequence() {
 
 bool isUtf8Locale() {
     return std::string_view(::nl_langinfo(CODESET)) == "UTF-8";
+}
+
+/// Nothing is said about characters beyond ASCII.
+bool isPlainLocale() {
+    return std::string_view(::nl_langinfo(CODESET)) == "ANSI_X3.4-1968";
+}
+
+/// What follows an escape character that the library has taken for one of its own: the rest of a
+/// control sequence that it does not know, or nothing.
+std::optional<KeyEvent> keyAfterEscape() {
+    constexpr char32_t kFirstFinal = 0x40;
+    constexpr char32_t kEscape = 0x1B;
+    wint_t code = 0;
+    if (::get_wch(&code) != OK) {
+        return KeyEvent{.key = Key::Escape};
+    }
+    if (code != U'[' && code != U'O') {
+        ::unget_wch(static_cast<wchar_t>(code)); // a key pressed right behind the other
+        return keyOfCharacter(kEscape);
+    }
+    std::string parameters;
+    ::wtimeout(::stdscr, kEscapeDelay);
+    while (::get_wch(&code) == OK && code < kFirstFinal) {
+        parameters += static_cast<char>(code);
+    }
+    ::nodelay(::stdscr, TRUE);
+    return keyOfSequence(parameters, code);
 }
 
 bool wantsColor(ColorUse use) {
@@ -108,6 +138,10 @@ CursesTerminal::open(const Options& options) {
     (void)std::setlocale(LC_CTYPE, ""); // numbers stay as the C locale writes them
     auto impl = std::make_unique<Impl>();
     impl->isUtf8 = isUtf8Locale();
+    if (isPlainLocale()) {
+        // What is typed is most likely UTF-8 all the same; what is shown stays ASCII.
+        (void)std::setlocale(LC_CTYPE, "C.UTF-8");
+    }
     impl->input.reset(std::fopen(kControllingTerminal, "re"));
     if (!impl->input) {
         return TerminalError{"There is no terminal to take keys from; --print does without."};
@@ -126,8 +160,9 @@ CursesTerminal::open(const Options& options) {
     ::nonl();
     ::nodelay(::stdscr, TRUE);
     ::keypad(::stdscr, TRUE);
-    constexpr int kEscapeDelay = 25; // milliseconds in which an escape sequence is complete
-    ::set_escdelay(kEscapeDelay);
+    if (std::getenv("ESCDELAY") == nullptr) {
+        ::set_escdelay(kEscapeDelay);
+    }
     if (wantsColor(options.color) && ::has_colors() && ::start_color() == OK) {
         ::use_default_colors();
         impl->hasAccentColor = ::init_pair(kAccentPair, COLOR_CYAN, -1) == OK;
@@ -196,10 +231,12 @@ std::optional<KeyEvent> CursesTerminal::read() {
         if (kind == ERR) {
             return std::nullopt;
         }
-        if (kind != KEY_CODE_YES) {
-            return keyOfCharacter(code);
-        }
-        if (const auto key = keyOfCode(code)) {
+        const std::optional<KeyEvent> character = keyOfCharacter(code);
+        const bool isEscape = kind == OK && character->key == Key::Escape;
+        const std::optional<KeyEvent> key = kind == KEY_CODE_YES ? keyOfCode(code)
+                                            : isEscape           ? keyAfterEscape()
+                                                                 : character;
+        if (key) {
             return key;
         }
     }

@@ -8,6 +8,35 @@
 
 namespace pallax::terminal {
 
+namespace {
+
+constexpr int kScrollColumns = 8; // at a key, of a row that does not fit
+
+/// By how many lines a key scrolls the help page, which shows `rows` of them; 0 for another key.
+int helpScroll(const KeyEvent& event, int rows) {
+    constexpr int kWheelLines = 3;
+    switch (event.key) {
+    case Key::Up:
+        return -1;
+    case Key::Down:
+        return 1;
+    case Key::PageUp:
+        return -rows;
+    case Key::PageDown:
+        return rows;
+    case Key::WheelUp:
+        return -kWheelLines;
+    case Key::WheelDown:
+        return kWheelLines;
+    case Key::Character:
+        return event.character == U'j' ? 1 : event.character == U'k' ? -1 : 0;
+    default:
+        return 0;
+    }
+}
+
+} // namespace
+
 FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
     : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }) {}
 
@@ -131,25 +160,25 @@ void FrontEnd::handleAlert(const KeyEvent& event) {
 }
 
 int FrontEnd::lastHelpFirst() const {
-    return std::max(static_cast<int>(helpLines().size()) - _helpRows, 0);
+    return std::max(static_cast<int>(helpLines(_toolkit.columns()).size()) - _helpRows, 0);
 }
 
 /// The arrows scroll where the page does not fit; any other key closes it.
 void FrontEnd::handleHelp(const KeyEvent& event) {
-    if (event.key == Key::Down && _helpFirst < lastHelpFirst()) {
-        ++_helpFirst;
-    } else if (event.key == Key::Up && _helpFirst > 0) {
-        --_helpFirst;
-    } else if (event.key != Key::Down && event.key != Key::Up) {
-        _isHelpShown = false;
-    }
+    const int lines = helpScroll(event, _helpRows);
+    _helpFirst = std::clamp(_helpFirst + lines, 0, lastHelpFirst());
+    _isHelpShown = lines != 0;
     needsDisplay();
 }
 
 void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
     TerminalTextField& field = terminalTextField(screen.field());
     if (event.key == Key::Escape) {
-        screen.cancelPressed();
+        if (field.isEditing() && !field.text().empty()) {
+            field.resignFirstResponder(); // what was typed is not lost by one key
+        } else {
+            screen.cancelPressed();
+        }
         return;
     }
     if (event.key == Key::PageUp || event.key == Key::PageDown) {
@@ -285,7 +314,6 @@ bool FrontEnd::moveCursor(TerminalTable& table, const KeyEvent& event) {
 }
 
 void FrontEnd::openOrScroll(TerminalTable& table, bool mayScroll) {
-    constexpr int kScrollColumns = 8;
     if (mayScroll && table.scrollSideways(kScrollColumns)) {
         return;
     }
@@ -295,7 +323,6 @@ void FrontEnd::openOrScroll(TerminalTable& table, bool mayScroll) {
 }
 
 void FrontEnd::goBack(TerminalTable& table) {
-    constexpr int kScrollColumns = 8;
     if (!table.scrollSideways(-kScrollColumns)) {
         _toolkit.navigation()->back();
     }

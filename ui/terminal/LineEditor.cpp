@@ -74,8 +74,10 @@ bool LineEditor::handleControl(char32_t character) {
 }
 
 bool LineEditor::insert(char32_t character) {
-    constexpr char32_t kDelete = 0x7F;
-    if (character == kDelete || character > kLastCodePoint || isSurrogate(character)) {
+    constexpr char32_t kDelete = 0x7F; // with it begin the control characters behind ASCII
+    constexpr char32_t kNoBreakSpace = 0xA0;
+    if ((character >= kDelete && character < kNoBreakSpace) || character > kLastCodePoint ||
+        isSurrogate(character)) {
         return false;
     }
     std::string bytes;

@@ -3,7 +3,10 @@
 #include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
+#include <array>
 #include <string>
+#include <string_view>
+#include <utility>
 
 namespace pallax::terminal {
 
@@ -11,45 +14,98 @@ namespace {
 
 constexpr int kFrameColumns = 4; // frame and blanks
 constexpr int kFrameRows = 2;
+constexpr int kKeyColumns = 18; // of the help page
+
+struct Help {
+    std::string_view keys;
+    std::string_view meaning;
+};
+
+constexpr auto kHelp = std::to_array<Help>({
+    {"Up Down  k j", "one row up or down"},
+    {"PgUp PgDn", "one page up or down"},
+    {"Home End  g G", "first or last row"},
+    {"Enter Right l", "open the row"},
+    {"Right Left  l h", "scroll a long row"},
+    {"Left h Backspace", "back"},
+    {"Esc", "clear the filter, or back"},
+    {"/", "filter rows by name or value"},
+    {"s", "save a snapshot"},
+    {"y", "copy the value"},
+    {"Tab", "next field of the save screen"},
+    {"Click, wheel", "open the row; scroll"},
+    {"Ctrl-L", "draw the screen again"},
+    {"Ctrl-Z", "suspend; fg comes back"},
+    {"?", "this help"},
+    {"q", "back; at the first pane, quit"},
+    {"Ctrl-C", "quit"},
+});
+
+/// The text in lines of at most so many columns, broken at blanks; a longer word is cut.
+std::vector<std::string> wrapped(std::string_view text, int columns) {
+    std::vector<std::string> lines(1);
+    while (!text.empty()) {
+        const std::size_t end = std::min(text.find(' '), text.size());
+        const std::string_view word = text.substr(0, end);
+        text.remove_prefix(std::min(end + 1, text.size()));
+        std::string& line = lines.back();
+        if (line.empty()) {
+            line = word;
+        } else if (columnsOf(line) + 1 + columnsOf(word) <= columns) {
+            line.append(1, ' ').append(word);
+        } else {
+            lines.emplace_back(word);
+        }
+    }
+    return lines;
+}
 
 } // namespace
 
 void drawAlert(Grid& grid, const Marks& marks, const ui::Alert& alert) {
     constexpr int kAir = 2;
     const std::string button = buttonFace(alert.button);
-    const int columns =
+    const int wanted =
         std::max({columnsOf(alert.title), columnsOf(alert.message) + kAir, columnsOf(button)});
-    const Box box = centeredBox(grid, columns + kFrameColumns, 2 + kFrameRows);
+    const int inside = std::min(wanted + kFrameColumns, grid.columns()) - kFrameColumns;
+    const std::vector<std::string> lines = wrapped(alert.message, inside);
+    const int rows = static_cast<int>(lines.size()) + 1;
+    const Box box = centeredBox(grid, wanted + kFrameColumns, rows + kFrameRows);
     drawBox(grid, marks, box, alert.title);
-    grid.put(box.inside().left, box.y + 1, alert.message, {}, box.inside());
-    drawButton(grid, box.inside().right, box.y + 2, button, true);
+    const int buttonRow = box.y + box.rows - 2;
+    for (int row = 0; row < rows - 1 && box.y + 1 + row < buttonRow; ++row) {
+        grid.put(box.inside().left, box.y + 1 + row, lines[static_cast<std::size_t>(row)], {},
+                 box.inside());
+    }
+    drawButton(grid, box.inside().right, buttonRow, button, true);
 }
 
-const std::vector<std::string_view>& helpLines() {
-    static const std::vector<std::string_view> kLines{
-        "Up Down  k j      one row up or down",
-        "PgUp PgDn         one page up or down",
-        "Home End  g G     first or last row",
-        "Enter Right l     open the row",
-        "Right Left        scroll a long row",
-        "Left h Backspace  back",
-        "Esc               clear the filter, or back",
-        "/                 filter rows by name or value",
-        "s                 save a snapshot",
-        "y                 copy the value",
-        "Tab               next field of the save screen",
-        "Ctrl-L            draw the screen again",
-        "Ctrl-Z            suspend; fg comes back",
-        "?                 this help",
-        "q                 back; at the first pane, quit",
-    };
-    return kLines;
+std::vector<std::string> helpLines(int columns) {
+    int wanted = 0;
+    for (const Help& help : kHelp) {
+        wanted = std::max(wanted, kKeyColumns + columnsOf(help.meaning));
+    }
+    const bool isNarrow = wanted + kFrameColumns > columns;
+    std::vector<std::string> lines;
+    for (const Help& help : kHelp) {
+        std::string line(help.keys);
+        if (isNarrow) {
+            lines.push_back(std::move(line));
+            for (const std::string& part : wrapped(help.meaning, columns - kFrameColumns - 1)) {
+                lines.push_back(std::string(1, ' ').append(part));
+            }
+        } else {
+            line.resize(kKeyColumns, ' ');
+            lines.push_back(line.append(help.meaning));
+        }
+    }
+    return lines;
 }
 
 int drawHelp(Grid& grid, const Marks& marks, int first) {
-    const auto& lines = helpLines();
+    const std::vector<std::string> lines = helpLines(grid.columns());
     int columns = 0;
-    for (const std::string_view line : lines) {
+    for (const std::string& line : lines) {
         columns = std::max(columns, columnsOf(line));
     }
     const Box box =
@@ -60,7 +116,7 @@ int drawHelp(Grid& grid, const Marks& marks, int first) {
     for (int row = 0; row < shown; ++row) {
         const int index = begin + row;
         if (index < static_cast<int>(lines.size())) {
-            const std::string_view line = lines[static_cast<std::size_t>(index)];
+            const std::string& line = lines[static_cast<std::size_t>(index)];
             grid.put(box.inside().left, box.y + 1 + row, line, {}, box.inside());
         }
     }

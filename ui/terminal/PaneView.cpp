@@ -193,17 +193,29 @@ void PaneView::drawToolbar(const TerminalNavigation& navigation, const TerminalT
     drawHints(items, table, end);
 }
 
+/// A text that does not fit loses its beginning: times and file names stand at the end.
+int PaneView::drawCutInFront(int x, int y, std::string_view text) {
+    const int right = _grid.columns() - kMargin;
+    const int beyond = x + columnsOf(text) - right;
+    if (beyond <= 0) {
+        return _grid.put(x, y, text);
+    }
+    const int start = _grid.put(x, y, _marks.more, kDim);
+    (void)_grid.put(x - beyond, y, text, {}, {start, right});
+    return right;
+}
+
 int PaneView::drawStatus(const ui::BarItems& items, const PaneStatus& status) {
     const int y = _grid.rows() - 1;
     int x = kMargin;
     if (status.message) {
-        return _grid.put(x, y, *status.message);
+        return drawCutInFront(x, y, *status.message);
     }
     if (isLoading(items)) {
         x = _grid.put(x, y, _marks.spinner.at(status.spinnerTurn % _marks.spinner.size())) + 1;
     }
     if (const ui::Label* label = labelOf(items)) {
-        x = _grid.put(x, y, label->text);
+        x = drawCutInFront(x, y, label->text);
     }
     return status.note.empty() ? x : _grid.put(x + 2, y, status.note, kDim);
 }

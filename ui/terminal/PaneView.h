@@ -45,6 +45,7 @@ private:
     void drawToolbar(const TerminalNavigation& navigation, const TerminalTable& table,
                      const PaneStatus& status);
     void drawFilterPrompt(const LineEditor& editor);
+    int drawCutInFront(int x, int y, std::string_view text);
     int drawStatus(const ui::BarItems& items, const PaneStatus& status);
     void drawHints(const ui::BarItems& items, const TerminalTable& table, int from);
 

@@ -11,7 +11,9 @@ namespace pallax::terminal {
 
 namespace {
 
-constexpr std::array kDeadly{SIGSEGV, SIGBUS, SIGFPE, SIGILL, SIGABRT, SIGQUIT};
+constexpr std::array kDeadly{SIGSEGV, SIGBUS, SIGFPE, SIGILL, SIGABRT, SIGQUIT, SIGSYS, SIGTRAP};
+/// The handler runs on a stack of its own, for the other may be what has run out.
+constexpr std::size_t kStackSize = std::size_t{32} << 10U;
 constexpr std::size_t kMaximumSequence = 256;
 
 /// A signal handler can reach nothing but what is global.
@@ -21,6 +23,7 @@ struct Restoration {
     bool hasModes = false;
     std::array<char, kMaximumSequence> sequence{};
     std::size_t size = 0;
+    std::array<char, kStackSize> stack{};
 };
 Restoration restoration;
 
@@ -41,9 +44,13 @@ TerminalRestorer::TerminalRestorer(int descriptor) {
     restoration.descriptor = descriptor;
     restoration.hasModes = ::tcgetattr(descriptor, &restoration.modes) == 0;
     restoration.size = 0;
+    stack_t stack{};
+    stack.ss_sp = restoration.stack.data();
+    stack.ss_size = restoration.stack.size();
+    (void)::sigaltstack(&stack, nullptr);
     struct sigaction action {};
     action.sa_handler = restoreAndDie;
-    action.sa_flags = static_cast<int>(SA_RESETHAND);
+    action.sa_flags = static_cast<int>(SA_RESETHAND | SA_ONSTACK);
     for (const int signal : kDeadly) {
         (void)::sigaction(signal, &action, nullptr);
     }
@@ -53,6 +60,9 @@ TerminalRestorer::~TerminalRestorer() {
     for (const int signal : kDeadly) {
         (void)std::signal(signal, SIG_DFL);
     }
+    stack_t none{};
+    none.ss_flags = SS_DISABLE;
+    (void)::sigaltstack(&none, nullptr);
 }
 
 void TerminalRestorer::setSequence(std::string_view sequence) {

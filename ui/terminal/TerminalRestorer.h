@@ -5,7 +5,7 @@
 namespace pallax::terminal {
 
 /// Restores the terminal when the process dies of a signal (a crash, an abort, Ctrl-\), and then
-/// lets it die of it. One at a time; the destructor gives the signals back.
+/// lets it die of it. One at a time; the destructor gives the signals their default actions.
 class TerminalRestorer {
 public:
     /// `descriptor` is the terminal, as it was before anything was drawn.

@@ -32,12 +32,21 @@ private:
     locale_t _previous;
 };
 
+/// Marks that would turn the direction of all that follows on the row.
+bool turnsDirection(char32_t codePoint) {
+    return (codePoint >= 0x202A && codePoint <= 0x202E) ||
+           (codePoint >= 0x2066 && codePoint <= 0x2069);
+}
+
 /// -1 for what cannot be shown.
 int columnsOfCodePoint(char32_t codePoint) {
     constexpr char32_t kFirstPrintable = 0x20;
     constexpr char32_t kDelete = 0x7F;
     if (codePoint < kDelete) {
         return codePoint < kFirstPrintable ? -1 : 1;
+    }
+    if (turnsDirection(codePoint)) {
+        return -1;
     }
     return ::wcwidth(static_cast<wchar_t>(codePoint));
 }

@@ -4,6 +4,7 @@
 
 #include <gtest/gtest.h>
 
+#include <tuple>
 #include <utility>
 
 namespace pallax::terminal {
@@ -35,6 +36,25 @@ TEST(CursesKeysTest, OtherCodesMeanNothing) {
 
 TEST(CursesKeysTest, AMouseCodeWithoutAnEventMeansNothing) {
     EXPECT_FALSE(keyOfCode(KEY_MOUSE).has_value());
+}
+
+TEST(CursesKeysTest, SequencesThatTheTerminalsDescriptionDoesNotTellHaveTheirKeysToo) {
+    const std::tuple<const char*, char32_t, Key> expected[] = {
+        {"", U'A', Key::Up},      {"", U'B', Key::Down},    {"", U'C', Key::Right},
+        {"", U'D', Key::Left},    {"", U'H', Key::Home},    {"", U'F', Key::End},
+        {"", U'Z', Key::BackTab}, {"", U'M', Key::Enter},   {"1", U'~', Key::Home},
+        {"7", U'~', Key::Home},   {"4", U'~', Key::End},    {"8", U'~', Key::End},
+        {"3", U'~', Key::Delete}, {"5", U'~', Key::PageUp}, {"6", U'~', Key::PageDown},
+    };
+    for (const auto& [parameters, final, key] : expected) {
+        const auto event = keyOfSequence(parameters, final);
+        ASSERT_TRUE(event.has_value()) << parameters;
+        EXPECT_EQ(event->key, key) << parameters;
+    }
+    for (const auto& [parameters, final] :
+         {std::pair{"200", U'~'}, {"", U'I'}, {"1;5", U'A'}, {"", U'~'}, {"5", U'A'}}) {
+        EXPECT_FALSE(keyOfSequence(parameters, final).has_value()) << parameters;
+    }
 }
 
 TEST(CursesKeysTest, CharactersThatStandForKeysBecomeThem) {

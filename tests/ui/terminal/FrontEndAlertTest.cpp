@@ -62,9 +62,9 @@ TEST_F(FrontEndAlertTest, AnAlertLiesOverThePane) {
     EXPECT_EQ(stage.screen(20, 5), R"(
 ┌ File Error ──────┐
 │ Unable to write  │
+│ file to disk     │
 │        [ Close ] │
 └──────────────────┘
- Updated 2023-11-14
 )");
 }
 
@@ -108,9 +108,9 @@ TEST_F(FrontEndAlertTest, AnAlertLiesOverTheHelpPageToo) {
     stage.type("?");
     stage.frontEnd.resize(40, 12);
     alert();
-    EXPECT_EQ(stage.line(4), "│ E┌ File Error ────────────────────┐  │");
+    EXPECT_EQ(stage.line(4), " Ph┌ File Error ────────────────────┐4");
     stage.press(Key::Enter);
-    EXPECT_EQ(stage.line(0), "┌ Keys ────────────────────────────────┐");
+    EXPECT_EQ(stage.line(0), " Pa┌ Keys ──────────────────────────┐");
 }
 
 TEST_F(FrontEndAlertTest, SeveralAlertsAreClosedOneByOne) {

@@ -241,7 +241,7 @@ TEST_F(FrontEndBrowsingTest, TheCursorStaysOnItsRowWhileRowsComeAndGo) {
  D               3 *
 
  ──────────────────
- Updated 2023-11-14
+ …11-14 at 22:13:20
 )");
     stage.tick(Dictionary{{"C", "2"}});
     EXPECT_EQ(stage.cursorName(), "C");
@@ -263,7 +263,7 @@ TEST_F(FrontEndBrowsingTest, APaneWhosePathVanishesIsLeft) {
  ──────────────────
 ▌Other             ›
  ──────────────────
- Updated 2023-11-14
+ …11-14 at 22:13:20
 )");
 }
 
@@ -304,7 +304,7 @@ TEST_F(FrontEndBrowsingTest, AScreenThatIsTooSmallSaysWhatItNeeds) {
  ──────────────────
 ▌Serving Cell Mea… ›
  ──────────────────
- Updated 2023-11-14
+ …11-14 at 22:13:20
 )");
 }
 

@@ -24,48 +24,48 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
     EXPECT_EQ(stage.screen(80, 24), R"(
  Pallax › Serving Cell Measurements
  ──────────────────────────────────────────────────────────────────────────────
-▌Version                                                                     1
- E-ARFCN      ┌ Keys ───────────────────────────────────────────┐         1850
- Physical Cell│ Up Down  k j      one row up or down            │          274
- Measured RSRP│ PgUp PgDn         one page up or down           │   -94.75 dBm
- Average RSRP │ Home End  g G     first or last row             │   -95.00 dBm
- Measured RSRQ│ Enter Right l     open the row                  │     -9.50 dB
-              │ Right Left        scroll a long row             │
+▌Version      ┌ Keys ───────────────────────────────────────────┐            1
+ E-ARFCN      │ Up Down  k j      one row up or down            │         1850
+ Physical Cell│ PgUp PgDn         one page up or down           │          274
+ Measured RSRP│ Home End  g G     first or last row             │   -94.75 dBm
+ Average RSRP │ Enter Right l     open the row                  │   -95.00 dBm
+ Measured RSRQ│ Right Left  l h   scroll a long row             │     -9.50 dB
               │ Left h Backspace  back                          │
               │ Esc               clear the filter, or back     │
               │ /                 filter rows by name or value  │
               │ s                 save a snapshot               │
               │ y                 copy the value                │
               │ Tab               next field of the save screen │
+              │ Click, wheel      open the row; scroll          │
               │ Ctrl-L            draw the screen again         │
               │ Ctrl-Z            suspend; fg comes back        │
               │ ?                 this help                     │
               │ q                 back; at the first pane, quit │
+              │ Ctrl-C            quit                          │
               └─────────────────────────────────────────────────┘
-
 
  ──────────────────────────────────────────────────────────────────────────────
  Updated 2023-11-14 at 22:13:20                        / filter  s Save  ? help
 )");
     EXPECT_EQ(stage.screen(40, 12), R"(
-┌ Keys ────────────────────────────────┐
-│ Up Down  k j      one row up or down │
-│ PgUp PgDn         one page up or dow │
-│ Home End  g G     first or last row  │
-│ Enter Right l     open the row       │
-│ Right Left        scroll a long row  │
-│ Left h Backspace  back               │
-│ Esc               clear the filter,  │
-│ /                 filter rows by nam │
-│ s                 save a snapshot    │
-│ y                 copy the value     │
-└──────────────────────────────────────┘
+ Pa┌ Keys ──────────────────────────┐
+ ──│ Up Down  k j                   │──
+▌Ve│  one row up or down            │1
+ E-│ PgUp PgDn                      │0
+ Ph│  one page up or down           │4
+ Me│ Home End  g G                  │m
+ Av│  first or last row             │m
+ Me│ Enter Right l                  │B
+   │  open the row                  │
+   │ Right Left  l h                │
+ ──│  scroll a long row             │──
+ Up└────────────────────────────────┘lp
 )");
     EXPECT_EQ(stage.screen(20, 5), R"(
 ┌ Keys ────────────┐
 │ Up Down  k j     │
-│ PgUp PgDn        │
-│ Home End  g G    │
+│  one row up or   │
+│  down            │
 └──────────────────┘
 )");
 }
@@ -75,12 +75,30 @@ TEST_F(FrontEndHelpTest, TheArrowsScrollItWhereItDoesNotFit) {
     stage.frontEnd.resize(20, 5);
     (void)stage.frontEnd.draw();
     stage.press(Key::Down);
-    EXPECT_EQ(stage.line(1), "│ PgUp PgDn        │");
+    EXPECT_EQ(stage.line(1), "│  one row up or   │");
     stage.press(Key::Down, 50);
-    EXPECT_EQ(stage.line(3), "│ q                │");
+    EXPECT_EQ(stage.line(3), "│  quit            │");
     stage.press(Key::Up);
-    EXPECT_EQ(stage.line(3), "│ ?                │");
+    EXPECT_EQ(stage.line(3), "│ Ctrl-C           │");
     stage.press(Key::Up, 50);
+    EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
+}
+
+TEST_F(FrontEndHelpTest, PagesWheelAndLettersScrollItToo) {
+    stage.type("?");
+    stage.frontEnd.resize(20, 5);
+    (void)stage.frontEnd.draw();
+    stage.type("j");
+    EXPECT_EQ(stage.line(1), "│  one row up or   │");
+    stage.type("k");
+    EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
+    stage.press(Key::PageDown);
+    EXPECT_EQ(stage.line(1), "│ PgUp PgDn        │");
+    stage.press(Key::PageUp);
+    EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
+    stage.frontEnd.handle({Key::WheelDown});
+    EXPECT_EQ(stage.line(1), "│ PgUp PgDn        │");
+    stage.frontEnd.handle({Key::WheelUp});
     EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
 }
 
@@ -92,15 +110,15 @@ TEST_F(FrontEndHelpTest, ScrolledToItsEndItFillsAScreenThatGrows) {
     stage.press(Key::Down, 50);
     EXPECT_EQ(stage.screen(20, 7), R"(
 ┌ Keys ────────────┐
-│ Tab              │
-│ Ctrl-L           │
-│ Ctrl-Z           │
-│ ?                │
-│ q                │
+│  back; at the    │
+│  first pane,     │
+│  quit            │
+│ Ctrl-C           │
+│  quit            │
 └──────────────────┘
 )");
     stage.press(Key::Up); // scrolls at once
-    EXPECT_EQ(stage.line(1), "│ y                │");
+    EXPECT_EQ(stage.line(1), "│ q                │");
     EXPECT_EQ(stage.screen(80, 24), fromTheFirstLine);
 }
 
@@ -152,7 +170,7 @@ TEST_F(FrontEndHelpTest, ItOpensAtItsFirstLineAgain) {
 std::vector<std::string> namedKeys() {
     constexpr std::size_t kColumn = 18;
     std::vector<std::string> names;
-    for (const std::string_view line : helpLines()) {
+    for (const std::string& line : helpLines(80)) {
         std::istringstream words{std::string(line.substr(0, kColumn))};
         for (std::string word; words >> word;) {
             names.push_back(word);

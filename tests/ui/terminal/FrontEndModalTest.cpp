@@ -96,8 +96,16 @@ TEST_F(FrontEndModalTest, SpacePressesTheButton) {
     EXPECT_EQ(outcome(), "saved ");
 }
 
-TEST_F(FrontEndModalTest, EscCancelsWhileItIsEdited) {
+TEST_F(FrontEndModalTest, EscCancelsWhileAnEmptyDescriptionIsEdited) {
+    stage.press(Key::Escape);
+    EXPECT_EQ(outcome(), "closed");
+}
+
+TEST_F(FrontEndModalTest, EscEndsTheEditingOfADescriptionAndOnlyThenCancels) {
     stage.type("text");
+    stage.press(Key::Escape);
+    EXPECT_EQ(outcome(), "open");
+    EXPECT_EQ(focus(), "Save");
     stage.press(Key::Escape);
     EXPECT_EQ(outcome(), "closed");
 }

@@ -44,7 +44,9 @@ TEST_F(PaneViewBarsTest, HintsThatDoNotFitAreLeftOutFromTheLeft) {
         {47, " Updated 2023-11-14 at 22:13:20         ? help"},
         {40, " Updated 2023-11-14 at 22:13:20  ? help"},
         {39, " Updated 2023-11-14 at 22:13:20"},
-        {20, " Updated 2023-11-14"},
+        {32, " Updated 2023-11-14 at 22:13:20"},
+        {31, " …dated 2023-11-14 at 22:13:20"},
+        {20, " …11-14 at 22:13:20"},
     };
     for (const auto& [columns, toolbar] : expected) {
         stage.frontEnd.resize(columns, 12);

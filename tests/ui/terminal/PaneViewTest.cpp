@@ -106,7 +106,7 @@ TEST_F(PaneViewTest, TheRootPaneShowsBranchesWithMarksAndListsWithCounts) {
  ──────────────────
 ▌Serving Cell Mea… ›
  ──────────────────
- Updated 2023-11-14
+ …11-14 at 22:13:20
 )");
 }
 
@@ -158,7 +158,7 @@ TEST_F(PaneViewTest, ASectionShowsNamesLeftAndValuesRight) {
  ──────────────────
 ▌Version         1
  ──────────────────
- Updated 2023-11-14
+ …11-14 at 22:13:20
 )");
 }
 
@@ -173,7 +173,7 @@ TEST_F(PaneViewTest, ALongNameEndsBeforeTheCountBehindIt) {
  Sixteen Column… 3 ›
  Fifteen Columns 3 ›
  ──────────────────
- Updated 2023-11-14
+ …11-14 at 22:13:20
 )");
 }
 
