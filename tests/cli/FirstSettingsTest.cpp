@@ -1,0 +1,79 @@
+#include "cli/Settings.h"
+#include "tests/cli/PallaxProcess.h"
+#include "tests/doubles/RuntimeFolder.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+
+namespace pallax {
+namespace {
+
+using doubles::contentOf;
+
+/// The script that `run` calls before it opens the viewer.
+class FirstSettings : public testing::Test {
+protected:
+    /// Runs it with nothing in the environment but these assignments; its exit status.
+    int run(const std::string& environment) const {
+        const std::string command = "env -i PATH=/usr/bin:/bin " + environment + " " +
+                                    PALLAX_SOURCE_DIR + "/scripts/first-settings 2>" +
+                                    world.path("err");
+        return std::system(command.c_str()); // NOLINT(cert-env33-c): the script is ours
+    }
+    std::string home() const { return "HOME=" + world.folder().string(); }
+
+    doubles::World world;
+    std::string file = world.path(".config/pallax/pallax.conf");
+    std::string snapshots = world.path(".local/state/pallax/snapshots");
+};
+
+TEST_F(FirstSettings, AreWrittenOnceAndTheSnapshotFolderIsMade) {
+    EXPECT_EQ(run(home()), 0);
+    EXPECT_TRUE(std::filesystem::is_directory(snapshots));
+    const SettingsResult settings = loadSettings({file});
+    ASSERT_TRUE(settings);
+    EXPECT_EQ(settings->snapshotDirectory, snapshots);
+    EXPECT_EQ(settings->saveButtonMarker, snapshots);
+    EXPECT_EQ(settings->onFatalRecord, OnFatalRecord::Stop);
+    EXPECT_EQ(contentOf(world.path("err")),
+              "Settings were written to " + file + "; snapshots go to " + snapshots + ".\n");
+
+    EXPECT_EQ(run(home()), 0);
+    EXPECT_EQ(contentOf(world.path("err")), "");
+}
+
+TEST_F(FirstSettings, ThatTheUserHasAreKept) {
+    std::filesystem::create_directories(world.path(".config/pallax"));
+    std::ofstream(file) << "on-fatal-record = skip\n";
+    EXPECT_EQ(run(home()), 0);
+    EXPECT_EQ(contentOf(file), "on-fatal-record = skip\n");
+    EXPECT_FALSE(std::filesystem::exists(snapshots));
+}
+
+TEST_F(FirstSettings, AMissingSnapshotFolderIsMadeAgain) {
+    EXPECT_EQ(run(home()), 0);
+    std::filesystem::remove_all(snapshots);
+    EXPECT_EQ(run(home()), 0);
+    EXPECT_TRUE(std::filesystem::is_directory(snapshots));
+}
+
+TEST_F(FirstSettings, FollowTheFoldersOfTheEnvironment) {
+    EXPECT_EQ(
+        run(home() + " XDG_CONFIG_HOME=" + world.path("c") + " XDG_STATE_HOME=" + world.path("s")),
+        0);
+    EXPECT_TRUE(std::filesystem::exists(world.path("c/pallax/pallax.conf")));
+    EXPECT_TRUE(std::filesystem::is_directory(world.path("s/pallax/snapshots")));
+    EXPECT_FALSE(std::filesystem::exists(file));
+}
+
+TEST_F(FirstSettings, AreNotWrittenToARelativeFolderNorWithoutAHome) {
+    EXPECT_EQ(run(home() + " XDG_CONFIG_HOME=relative"), 0);
+    EXPECT_TRUE(std::filesystem::exists(file)) << "as the viewer reads them";
+    EXPECT_EQ(run(""), 0);
+}
+
+} // namespace
+} // namespace pallax
