@@ -363,7 +363,8 @@ TEST_P(RealSnapshotTest, TheSavedDisplayIsThatOfThePane) {
 
 INSTANTIATE_TEST_SUITE_P(Technologies, RealSnapshotTest,
                          testing::Values(RealTechnology{"Zorell_GSM", "ZOR_GSM", 0x4125},
-                                         RealTechnology{"Zorell_LTE", "LTE", 0xB17F}),
+                                         RealTechnology{"Zorell_LTE", "LTE", 0xB17F},
+                                         RealTechnology{"Zorell_UTRAN2", "UTRAN", 0xD0E0}),
                          [](const auto& param) { return std::string(param.param.templateName); });
 
 } // namespace
