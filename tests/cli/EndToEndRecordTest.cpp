@@ -1,7 +1,10 @@
 #include "host/Recording.h"
 #include "tests/cli/EndToEnd.h"
+#include "tests/cli/PallaxTerminal.h"
+#include "tests/doubles/RuntimeFolder.h"
 
 #include <csignal>
+#include <cstdlib>
 #include <filesystem>
 #include <sys/resource.h>
 
@@ -182,6 +185,58 @@ TEST_F(EndToEndRecord, WithoutAServiceItWaitsAndASignalEndsIt) {
     EXPECT_TRUE(recorder.says("<3>Could not create the ports necessary\n"));
     end(recorder);
     EXPECT_TRUE(world.sockets().empty());
+}
+
+TEST_F(EndToEndRecord, OnATerminalItTellsHowFarItHasCome) {
+    doubles::PallaxTerminal terminal(world, {"record", world.path("a.pcapng")}, {});
+    EXPECT_TRUE(terminal.shows("0 packets, 0 bytes, waiting for the modem"));
+    terminal.signal(SIGINT);
+    EXPECT_EQ(terminal.wait(), 0);
+
+    PallaxProcess service(world,
+                          {"service", "--play", registrations("b.pcap", 1000), "--speed", "2"});
+    ASSERT_TRUE(serviceIsThere());
+    doubles::PallaxTerminal recording(world, {"record", world.path("b.pcapng")}, {});
+    EXPECT_TRUE(recording.shows(" packets/s"));
+    recording.signal(SIGINT);
+    EXPECT_EQ(recording.wait(), 0);
+    EXPECT_TRUE(recording.bytes().ends_with("\r\n")) << "the shell's prompt has a line of its own";
+    end(service);
+}
+
+TEST_F(EndToEndRecord, AfterAKilledServiceItGoesOnInTheSameFile) {
+    const std::vector<std::string> arguments{"service", "--play",  registrations("a.pcap", 100),
+                                             "--loop",  "--speed", "50"};
+    const std::string file = world.path("a.pcapng");
+    std::optional<PallaxProcess> service(std::in_place, world, arguments);
+    ASSERT_TRUE(serviceIsThere());
+    PallaxProcess recorder(world, {"record", file});
+    EXPECT_TRUE(eventually([&] { return packetsIn(file) > 10; }));
+    service->signal(SIGKILL);
+    EXPECT_EQ(service->wait(), -SIGKILL);
+    const int before = packetsIn(file);
+    service.emplace(world, arguments);
+    EXPECT_TRUE(eventually([&] { return packetsIn(file) > before + 10; }));
+    end(recorder);
+    end(*service);
+    EXPECT_EQ(run({"decode", file}).status, 0);
+}
+
+TEST_F(EndToEndRecord, TsharkReadsItWithoutComplaint) {
+    if (std::system("command -v tshark >/dev/null") != 0) { // NOLINT(cert-env33-c)
+        GTEST_SKIP() << "tshark is not installed";
+    }
+    PallaxProcess service(world, {"service", "--play", gsmAttach(), "--speed", "max"});
+    ASSERT_TRUE(serviceIsThere());
+    const std::string file = world.path("a.pcapng");
+    ASSERT_EQ(run({"record", file}).status, 0);
+    const std::string said = world.path("tshark");
+    const std::string command = "tshark -r " + file + " -T fields -e frame.interface_name > " +
+                                world.path("names") + " 2> " + said;
+    EXPECT_EQ(std::system(command.c_str()), 0); // NOLINT(cert-env33-c)
+    EXPECT_EQ(doubles::contentOf(said).find("tshark: "), std::string::npos);
+    EXPECT_TRUE(doubles::contentOf(world.path("names")).starts_with("Zorell_GSM\n"));
+    end(service);
 }
 
 } // namespace
