@@ -254,6 +254,19 @@ TEST_F(EndToEndSocketFolder, InAFolderThatIsMissing) {
     isRefused(world.path("missing/pallax"), "cannot be made: No such file or directory");
 }
 
+TEST_F(EndToEndSocketFolder, WhereAServiceRunsAlreadyASecondOneIsRefused) {
+    const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)}});
+    PallaxProcess first(world, {"service", "--play", recording});
+    EXPECT_TRUE(doubles::eventually([this] { return !world.sockets().empty(); }));
+    const Run second = run({"service", "--play", recording});
+    EXPECT_EQ(second.status, 1);
+    EXPECT_EQ(second.err,
+              "pallax: A telephony service named com.norvane.telephony is already running.\n");
+    EXPECT_EQ(run({"service", "--status"}).status, 0) << "the first is none the worse";
+    first.signal(SIGTERM);
+    EXPECT_EQ(first.wait(), 0);
+}
+
 TEST_F(EndToEndSocketFolder, OfAnotherUser) {
     if (::geteuid() != 0) {
         GTEST_SKIP() << "only root can give a folder away";

@@ -4,8 +4,11 @@
 #include "tests/doubles/RuntimeFolder.h"
 
 #include <gtest/gtest.h>
+#include <rapidcheck.h>
 
+#include <algorithm>
 #include <csignal>
+#include <filesystem>
 #include <sys/resource.h>
 
 namespace pallax {
@@ -79,6 +82,30 @@ TEST_F(PcapNgWriterTest, IsReadBackToTheNanosecondWhileItIsBeingWritten) {
     EXPECT_EQ(first->time, kStamp);
     EXPECT_EQ(first->data.size(), 0U);
     EXPECT_EQ((*recording)->next()->data.size(), 1U);
+}
+
+TEST_F(PcapNgWriterTest, WhateverIsWrittenIsReadBack) {
+    EXPECT_TRUE(rc::check([this](const std::vector<std::vector<std::uint8_t>>& packets) {
+        const auto writer = create(Existing::Overwrite);
+        const auto interface = writer->interfaceFor(kZorellLte, "Zorell_LTE");
+        std::vector<Time> times;
+        for (const auto& packet : packets) {
+            const auto stamp = *rc::gen::inRange<std::int64_t>(0, std::int64_t{1} << 62U);
+            times.emplace_back(std::chrono::nanoseconds(stamp));
+            RC_ASSERT(!writer->write(*interface, times.back(), packet));
+        }
+        RC_ASSERT(writer->size() == std::filesystem::file_size(path));
+        const auto recording = Recording::open(path);
+        for (std::size_t index = 0; index < packets.size(); ++index) {
+            const auto read = (*recording)->next();
+            RC_ASSERT(read.has_value());
+            RC_ASSERT(read->time == times[index]);
+            RC_ASSERT(std::equal(read->data.begin(), read->data.end(), packets[index].begin(),
+                                 packets[index].end()));
+        }
+        RC_ASSERT(!(*recording)->next());
+        RC_ASSERT(!(*recording)->error());
+    }));
 }
 
 TEST_F(PcapNgWriterTest, ATechnologyIsOneInterface) {
