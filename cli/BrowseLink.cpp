@@ -9,10 +9,10 @@
 namespace pallax {
 
 BrowseLink::BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                       StandardOutput& notices)
+                       StandardOutput& notices, std::string_view localPortName)
     : _child(child), _notices(notices),
-      _localPortName(child != nullptr ? child->privateName(PallaxModel::kLocalPortName)
-                                      : std::string(PallaxModel::kLocalPortName)),
+      _localPortName(child != nullptr ? child->privateName(localPortName)
+                                      : std::string(localPortName)),
       _clock(_wallClock, _queue), _socketPorts(_queue, std::move(directory), &_clock),
       _ports(_socketPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
       _telephony(_socketPorts,

@@ -21,9 +21,11 @@ class StandardOutput;
 /// service (a child's or the machine's), the source's clock, and the templates.
 class BrowseLink {
 public:
-    /// `child` is null for the machine's own service. What is referred to outlives the link.
+    /// `child` is null for the machine's own service; a child's clients get names of their own,
+    /// made of `localPortName`. What is referred to outlives the link.
     BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-               StandardOutput& notices);
+               StandardOutput& notices,
+               std::string_view localPortName = PallaxModel::kLocalPortName);
 
     AsioMainQueue& queue() { return _queue; }
     SourceClock& clock() { return _clock; }

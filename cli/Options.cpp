@@ -17,6 +17,7 @@ constexpr const char* kFooter = R"(Examples:
   modem-dump | pallax -                browse what another program records
   pallax decode drive.pcap             its last display as JSON
   pallax decode --every tick --format csv drive.pcap > drive.csv
+  pallax record drive.pcapng           write what the live modem sends to a file
   pallax service --play drive.pcap     let viewers connect to a played recording
 
 A recording that is named like a command is given with its folder: pallax ./decode
@@ -31,9 +32,23 @@ constexpr const char* kDecodeFooter = R"(Examples:
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is standard input.)";
 
+constexpr const char* kRecordFooter = R"(Examples:
+  pallax record drive.pcapng
+  pallax record --technology lte --rotate-size 100M drive.pcapng
+  pallax record - | ssh desk pallax service --relay -
+
+With --rotate-size or --rotate-seconds the files are drive-0001.pcapng, drive-0002.pcapng, ...
+Recording ends with Ctrl-C, and with the source. A viewer may run at the same time.)";
+
 constexpr const char* kServiceFooter = R"(Examples:
   pallax service --play drive.pcap
-  pallax service --play drive.pcap --speed max --loop)";
+  pallax service --play drive.pcap --speed max --loop
+  ssh phone modem-dump | pallax service --relay -
+  pallax service --status
+
+Every client gets a channel of its own. A played recording begins anew for each; what is relayed
+goes to all as it comes, and the service ends with it. A client that is too slow loses packets and
+delays nobody; with --speed max it sets its own pace and loses nothing.)";
 
 void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
     const auto takeSpeed = [&play](const std::string& text) {
@@ -71,8 +86,15 @@ void addChoice(CLI::App& app, const std::string& name, Value& value,
     app.add_option_function<std::string>(name, take, description)->type_name(names);
 }
 
-void addBrowse(CLI::App& app, BrowseOptions& options) {
+void addLogLevel(CLI::App& app, std::optional<int>& level) {
     constexpr int kHighestLevel = 7;
+    app.add_option("--log-level", level,
+                   "Write system-log lines up to this priority to standard error")
+        ->check(CLI::Range(0, kHighestLevel).name("").description(""))
+        ->type_name("0-7");
+}
+
+void addBrowse(CLI::App& app, BrowseOptions& options) {
     CLI::Option* recording =
         app.add_option(
                "RECORDING", options.recording,
@@ -93,19 +115,21 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
     addPlay(app, options.play, recording);
     app.add_flag("--keep-going", options.keepGoing,
                  "Drop a record that cannot be read instead of ending with status 70");
-    app.add_option("--log-level", options.logLevel,
-                   "Write system-log lines up to this priority to standard error")
-        ->check(CLI::Range(0, kHighestLevel).name("").description(""))
-        ->type_name("0-7");
+    addLogLevel(app, options.logLevel);
+}
+
+void addTechnology(CLI::App& app, const RecordedTechnology*& technology,
+                   const std::string& description) {
+    std::vector<std::pair<std::string, const RecordedTechnology*>> technologies;
+    for (const RecordedTechnology& each : recordedTechnologies()) {
+        technologies.emplace_back(each.commandName, &each);
+    }
+    addChoice(app, "--technology", technology, technologies, description);
 }
 
 void addDecode(CLI::App& app, DecodeOptions& options) {
-    std::vector<std::pair<std::string, const RecordedTechnology*>> technologies;
-    for (const RecordedTechnology& technology : recordedTechnologies()) {
-        technologies.emplace_back(technology.commandName, &technology);
-    }
-    addChoice(app, "--technology", options.technology, technologies,
-              "What the recordings are of (otherwise their link type tells)");
+    addTechnology(app, options.technology,
+                  "What the recordings are of (otherwise their link type tells)");
     addChoice<std::optional<Every>>(
         app, "--every", options.every,
         {{"end", Every::End}, {"tick", Every::Tick}, {"packet", Every::Packet}},
@@ -123,19 +147,99 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
     app.footer(kDecodeFooter);
 }
 
-void addService(CLI::App& app, ServiceOptions& options) {
-    CLI::Option* recording =
-        app.add_option("--play", options.recording, "The recording to play to each viewer")
-            ->required()
-            ->type_name("RECORDING");
-    addPlay(app, options.play, recording);
-    app.footer(kServiceFooter);
+void addRecord(CLI::App& app, RecordOptions& options) {
+    constexpr double kLongest = 1e9; // seconds, about 30 years
+    app.add_option("FILE", options.files.path,
+                   "The recording to write (pcapng; - is standard output)")
+        ->required()
+        ->type_name("");
+    addTechnology(app, options.technology, "Refuse a modem that speaks another technology");
+    const auto takeSize = [&options](const std::string& text) {
+        options.files.rotateSize = parseSize(text);
+        if (!options.files.rotateSize) {
+            throw CLI::ValidationError("--rotate-size",
+                                       "\"" + text + "\" is no size like 4096, 64k, 100M or 2G");
+        }
+    };
+    app.add_option_function<std::string>("--rotate-size", takeSize,
+                                         "Begin the next file before one has more bytes than that")
+        ->type_name("BYTES[k|M|G]");
+    const auto takeSeconds = [&options](const double& seconds) {
+        if (!(seconds > 0 && seconds <= kLongest)) {
+            throw CLI::ValidationError("--rotate-seconds", "it takes a number above 0");
+        }
+        options.files.rotateAfter = std::chrono::duration_cast<std::chrono::nanoseconds>(
+            std::chrono::duration<double>(seconds));
+    };
+    app.add_option_function<double>("--rotate-seconds", takeSeconds,
+                                    "Begin the next file after so many seconds")
+        ->type_name("SECONDS");
+    app.add_flag_callback(
+        "--overwrite", [&options] { options.files.existing = PcapNgWriter::Existing::Overwrite; },
+        "Replace files that exist already");
+    addLogLevel(app, options.logLevel);
+    app.footer(kRecordFooter);
 }
 
 /// CLI11's messages may have several lines; the user gets one sentence.
 ParseEnd wrongUsage(std::string reason) {
     std::replace(reason.begin(), reason.end(), '\n', ' ');
     return {kExitWrongUsage, "pallax: " + reason + " (pallax --help tells more)\n"};
+}
+
+/// What the service is to do, one of them.
+struct ServiceRequest {
+    ServiceOptions options;
+    std::string relayed; ///< a stream; empty where none is asked for
+    bool status = false;
+};
+
+void addServicePlay(CLI::App& app, ServiceOptions& options) {
+    CLI::Option* recording =
+        app.add_option("--play", options.recording, "The recording to play to each client")
+            ->type_name("RECORDING");
+    addPlay(app, options.play, recording);
+}
+
+void addServiceRelay(CLI::App& app, std::string& relayed) {
+    const auto take = [&relayed](const std::string& text) {
+        if (text != "-") {
+            throw CLI::ValidationError("--relay", "only -, standard input, can be relayed");
+        }
+        relayed = text;
+    };
+    app.add_option_function<std::string>(
+           "--relay", take, "Pass on the live pcap stream of standard input (-) to every client")
+        ->type_name("-")
+        ->excludes("--play");
+}
+
+void addServiceStatus(CLI::App& app, bool& status) {
+    app.add_flag("--status", status, "Print what the running service serves, and end")
+        ->excludes("--play")
+        ->excludes("--relay");
+}
+
+void addService(CLI::App& app, ServiceRequest& request) {
+    addServicePlay(app, request.options);
+    addServiceRelay(app, request.relayed);
+    addServiceStatus(app, request.status);
+    app.footer(kServiceFooter);
+}
+
+ParsedOptions serviceOptions(const ServiceRequest& request) {
+    if (request.status) {
+        return ServiceStatusOptions();
+    }
+    ServiceOptions options = request.options;
+    if (!request.relayed.empty()) {
+        options.recording = request.relayed;
+        options.relay = true;
+    }
+    if (options.recording.empty()) {
+        return wrongUsage("the service needs --play, --relay or --status");
+    }
+    return options;
 }
 
 ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
@@ -174,13 +278,17 @@ ParsedOptions parseOptions(std::vector<std::string> arguments) {
     CLI::App app("Pallax shows what a phone's cellular radio is doing.", "pallax");
     BrowseOptions browse;
     DecodeOptions decode;
-    ServiceOptions service;
+    RecordOptions record;
+    ServiceRequest service;
     prepare(app);
     addBrowse(app, browse);
     app.footer(kFooter);
     CLI::App* decodeApp = app.add_subcommand("decode", "Recordings to JSON or CSV");
     prepare(*decodeApp);
     addDecode(*decodeApp, decode);
+    CLI::App* recordApp = app.add_subcommand("record", "Write the live channel to a recording");
+    prepare(*recordApp);
+    addRecord(*recordApp, record);
     CLI::App* serviceApp =
         app.add_subcommand("service", "Run the telephony service that viewers connect to");
     prepare(*serviceApp);
@@ -200,14 +308,21 @@ ParsedOptions parseOptions(std::vector<std::string> arguments) {
         }
     }
     if (loopsStandardInput(browse.recording.value_or(""), browse.play) ||
-        loopsStandardInput(service.recording, service.play)) {
+        loopsStandardInput(service.options.recording, service.options.play)) {
         return wrongUsage("standard input can be played only once, not with --loop");
+    }
+    if (record.files.path == "-" && record.files.rotates()) {
+        return wrongUsage("standard output is one recording, without --rotate-size and "
+                          "--rotate-seconds");
+    }
+    if (recordApp->parsed()) {
+        return record;
     }
     if (decodeApp->parsed()) {
         return decode;
     }
     if (serviceApp->parsed()) {
-        return service;
+        return serviceOptions(service);
     }
     return browse;
 }

@@ -2,6 +2,7 @@
 
 #include "cli/DecodeCommand.h"
 #include "cli/ExitStatus.h"
+#include "cli/RecordOptions.h"
 #include "telephony/Service.h"
 #include "ui/terminal/CursesTerminal.h"
 
@@ -28,7 +29,11 @@ struct ParseEnd {
     std::string text;  ///< with its line end
 };
 
-using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, ServiceOptions, ParseEnd>;
+/// `pallax service --status`.
+struct ServiceStatusOptions {};
+
+using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions,
+                                   ServiceStatusOptions, ParseEnd>;
 
 /// `arguments` are those after the program's name.
 ParsedOptions parseOptions(std::vector<std::string> arguments);

@@ -17,8 +17,12 @@ using namespace pallax;
 struct Run {
     ExitStatus operator()(const BrowseOptions& options) const { return runBrowse(options); }
     ExitStatus operator()(const DecodeOptions& options) const { return runDecode(options); }
+    ExitStatus operator()(const RecordOptions& options) const { return runRecord(options); }
     ExitStatus operator()(const ServiceOptions& options) const {
         return runService(options) == 0 ? kExitSuccess : kExitFailure;
+    }
+    ExitStatus operator()(const ServiceStatusOptions& /*options*/) const {
+        return printServiceStatus() == 0 ? kExitSuccess : kExitFailure;
     }
     ExitStatus operator()(const ParseEnd& end) const {
         const bool wanted = end.status == kExitSuccess;

@@ -204,6 +204,7 @@ int runChildService(int argc, char** argv) {
     options.play.speed = parseSpeed(arguments[kSpeed]).value_or(1.0);
     options.play.loop = arguments[kLoop] == kLooping;
     options.recording = arguments[kRecording];
+    options.lossless = true; // its only client is the viewer that has started it
     std::int64_t interval = 0;
     const std::string& text = arguments[kInterval];
     (void)std::from_chars(text.data(), text.data() + text.size(), interval);

@@ -25,8 +25,8 @@ struct PlayOptions {
     std::chrono::nanoseconds displayInterval = std::chrono::seconds(2);
 };
 
-/// Plays a source into a sink with the source's own timing. Nothing is dropped: one chunk is
-/// under way at a time, so a slow receiver slows the player.
+/// Plays a source into a sink with the source's own timing. The player drops nothing: one chunk is
+/// under way at a time, so a sink that waits for its receiver slows the player.
 ///
 /// Every packet goes with its source time. The first packet's time goes ahead of all, even when
 /// that packet is not wanted; while nothing is due, the running time goes at least every half

@@ -15,9 +15,9 @@ public:
     virtual void write(const FrameHeader& header, Bytes data) = 0;
     /// Bytes in the present chunk.
     virtual std::size_t pending() const = 0;
-    /// Sends the chunk and then calls `done`, as a block of the main queue: as late as the
-    /// receiver makes it. Nothing is written meanwhile. After the receiver has gone `done` is
-    /// not called.
+    /// Sends the chunk and calls `done`, as a block of the main queue: as late as the receiver
+    /// makes it, or at once where the sink keeps what the receiver has no time for. Nothing is
+    /// written meanwhile. After the receiver has gone `done` need not be called.
     virtual void flush(std::function<void()> done) = 0;
 };
 

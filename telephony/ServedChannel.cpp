@@ -1,6 +1,7 @@
 #include "telephony/ServedChannel.h"
 
 #include "host/SocketMessagePorts.h"
+#include "platform/Format.h"
 #include "platform/TelephonyConstants.h"
 #include "telephony/ControlMessages.h"
 
@@ -8,16 +9,37 @@
 
 namespace pallax {
 
+namespace {
+
+std::string lossSentence(const std::string& receiver, std::uint64_t count) {
+    return count == 0
+               ? formatText("%@ is too slow: packets are dropped.", {receiver})
+               : formatText("%@ has caught up: %llu packets were dropped.", {receiver, count});
+}
+
+} // namespace
+
 int ServedChannel::open(Setup setup, std::unique_ptr<ServedChannel>& channel) {
-    auto sink = SocketSink::connect(setup.queue, setup.ports.directory(), setup.receiverPortName,
-                                    std::move(setup.closed));
+    const auto lost = [report = setup.report,
+                       receiver = setup.receiverPortName](std::uint64_t count) {
+        if (report) {
+            report(lossSentence(receiver, count));
+        }
+    };
+    auto sink = SocketSink::connect({setup.queue, setup.mostWaiting, std::move(setup.closed), lost},
+                                    setup.ports.directory(), setup.receiverPortName);
     if (sink == nullptr) {
         return ECONNREFUSED;
     }
     std::unique_ptr<ServedChannel> made(
-        new ServedChannel(std::move(setup.source), std::move(sink)));
+        new ServedChannel(std::move(setup.source), std::move(sink), setup.receiverPortName));
     made->_player = std::make_unique<PacketPlayer>(PacketPlayer::Setup{
-        setup.queue, *made->_source, *made->_sink, setup.options, std::move(setup.ended)});
+        setup.queue, *made->_source, *made->_sink, setup.options,
+        [self = made.get(), ended = std::move(setup.ended)](const std::string& failure) {
+            self->_isStreaming = false;
+            self->_hasEnded = true;
+            ended(failure);
+        }});
     auto local = setup.ports.createLocal(
         setup.portName, [self = made.get()](std::int32_t /*identifier*/, Bytes data) {
             return self->answer(data);
@@ -31,8 +53,10 @@ int ServedChannel::open(Setup setup, std::unique_ptr<ServedChannel>& channel) {
     return 0;
 }
 
-ServedChannel::ServedChannel(std::unique_ptr<PacketSource> source, std::unique_ptr<SocketSink> sink)
-    : _source(std::move(source)), _sink(std::move(sink)) {}
+ServedChannel::ServedChannel(std::unique_ptr<PacketSource> source, std::unique_ptr<SocketSink> sink,
+                             std::string receiverPortName)
+    : _source(std::move(source)), _sink(std::move(sink)),
+      _receiverPortName(std::move(receiverPortName)) {}
 
 ServedChannel::~ServedChannel() = default;
 
@@ -48,9 +72,15 @@ std::optional<ByteBuffer> ServedChannel::answer(Bytes request) {
     }
     const bool everything = technology == kHXLogChannelTechnology_IFX;
     if (auto filter = CodeFilter::fromStartCommand(*message, everything)) {
+        _isStreaming = !_hasEnded;
         _player->play(std::move(*filter));
     }
     return std::nullopt;
+}
+
+ServiceStatus::Client ServedChannel::status() const {
+    return {_receiverPortName, _isStreaming, static_cast<std::int64_t>(_sink->sent()),
+            static_cast<std::int64_t>(_sink->dropped())};
 }
 
 } // namespace pallax

@@ -2,6 +2,7 @@
 
 #include "telephony/PacketPlayer.h"
 #include "telephony/PacketSource.h"
+#include "telephony/ServiceStatus.h"
 #include "telephony/SocketSink.h"
 
 #include <functional>
@@ -24,6 +25,10 @@ public:
         std::string receiverPortName; ///< of the client's local port
         std::unique_ptr<PacketSource> source;
         PlayOptions options;
+        /// See SocketSink.
+        std::optional<std::size_t> mostWaiting;
+        /// Hears, as one sentence, what becomes of a client that is slow.
+        std::function<void(const std::string& sentence)> report;
         /// The client has gone; may destroy the channel.
         std::function<void()> closed;
         /// The source has come to its end, with its failure or an empty text.
@@ -36,12 +41,20 @@ public:
     ServedChannel(const ServedChannel&) = delete;
     ServedChannel& operator=(const ServedChannel&) = delete;
 
+    ServiceStatus::Client status() const;
+    /// True while the client waits for more: it has started the stream, and no end was told.
+    bool isStreaming() const { return _isStreaming; }
+
 private:
-    ServedChannel(std::unique_ptr<PacketSource> source, std::unique_ptr<SocketSink> sink);
+    ServedChannel(std::unique_ptr<PacketSource> source, std::unique_ptr<SocketSink> sink,
+                  std::string receiverPortName);
     std::optional<ByteBuffer> answer(Bytes request);
 
     std::unique_ptr<PacketSource> _source;
     std::unique_ptr<SocketSink> _sink;
+    std::string _receiverPortName;
+    bool _isStreaming = false;
+    bool _hasEnded = false;
     std::unique_ptr<PacketPlayer> _player;
     std::unique_ptr<LocalMessagePort> _port;
 };

@@ -3,6 +3,8 @@
 #include "host/AsioMainQueue.h"
 #include "host/SocketMessagePorts.h"
 #include "telephony/RecordingSource.h"
+#include "telephony/Relay.h"
+#include "telephony/ServiceStatus.h"
 #include "telephony/StreamSource.h"
 #include "telephony/TelephonyServer.h"
 
@@ -23,48 +25,115 @@ void complain(const std::string& sentence) {
     (void)std::fprintf(stderr, "pallax: %s\n", sentence.c_str());
 }
 
-/// A factory of sources; fails at once for what no channel could play.
-Result<PacketSourceFactory, HostError> sourceFactory(const std::string& path,
-                                                     AsioMainQueue& queue) {
-    auto recording = openKnownRecording(path);
+/// What is served: the technology, and the sources, one for each channel.
+struct Program {
+    std::string technology;
+    PacketSourceFactory makeSource;
+    std::shared_ptr<Relay> relay; ///< null for what is no live stream
+};
+
+Result<std::unique_ptr<PacketSource>, HostError> takeOnce(std::unique_ptr<PacketSource>& stream) {
+    if (stream == nullptr) {
+        return HostError{"Standard input is already being played."};
+    }
+    return std::move(stream);
+}
+
+/// Fails at once for what no channel could play. `relayEnded` is called after a live stream's end.
+Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueue& queue,
+                                     std::function<void(bool isOrderly)> relayEnded) {
+    auto recording = openKnownRecording(options.recording);
     if (!recording) {
         return recording.error();
     }
-    if (path != "-") {
-        return PacketSourceFactory([path] { return RecordingSource::open(path); });
+    Program program;
+    program.technology = (*recording)->technology()->identifier;
+    if (options.recording != "-") {
+        program.makeSource = [path = options.recording] { return RecordingSource::open(path); };
+        return program;
     }
-    const auto stream = std::make_shared<std::unique_ptr<Recording>>(std::move(recording).value());
-    return PacketSourceFactory(
-        [stream, &queue]() -> Result<std::unique_ptr<PacketSource>, HostError> {
-            if (*stream == nullptr) {
-                return HostError{"Standard input is already being played."};
-            }
-            return std::unique_ptr<PacketSource>(
-                std::make_unique<StreamSource>(queue, std::move(*stream)));
-        });
+    const auto stream = std::make_shared<std::unique_ptr<PacketSource>>(
+        std::make_unique<StreamSource>(queue, std::move(recording).value()));
+    if (!options.relay) {
+        program.makeSource = [stream] { return takeOnce(*stream); };
+        return program;
+    }
+    program.relay = std::make_shared<Relay>(
+        Relay::Setup{queue, queue, std::move(*stream), complain, std::move(relayEnded)});
+    program.makeSource = [relay =
+                              program.relay]() -> Result<std::unique_ptr<PacketSource>, HostError> {
+        return relay->source();
+    };
+    return program;
 }
+
+/// What may be lost, and when packets are due.
+TelephonyServer::Setup serverSetup(const ServiceOptions& options, AsioMainQueue& queue,
+                                   SocketMessagePorts& ports, const Program& program) {
+    TelephonyServer::Setup setup{queue,        ports,   options.controlPortName, program.makeSource,
+                                 options.play, complain};
+    setup.technology = program.technology;
+    if (options.relay) {
+        setup.options.speed = PlayOptions::kAsFastAsTaken; // the stream has its own pace
+    }
+    const bool clientSetsPace = std::isinf(options.play.speed) && !options.relay;
+    if (!options.lossless && !clientSetsPace) {
+        setup.mostWaiting = TelephonyServer::kMostWaiting;
+    }
+    return setup;
+}
+
+/// Stops the queue once the clients have been told the end, or take too long to hear it.
+class LastWords {
+public:
+    explicit LastWords(AsioMainQueue& queue) : _queue(queue) {}
+
+    void begin(const TelephonyServer& server) {
+        _looks = _queue.scheduleRepeating(kLook, [this, &server] {
+            _waited += kLook;
+            if (!server.isStreaming() || _waited >= kPatience) {
+                _queue.stop();
+            }
+        });
+    }
+
+private:
+    static constexpr std::chrono::milliseconds kLook{20};
+    static constexpr std::chrono::milliseconds kPatience{2000};
+
+    AsioMainQueue& _queue;
+    std::unique_ptr<RepeatingTimer> _looks;
+    std::chrono::milliseconds _waited{0};
+};
 
 int serve(const ServiceOptions& options, const std::function<void()>& ready,
           SocketDirectory directory) {
+    directory.removeStaleSockets();
     AsioMainQueue queue;
     SocketMessagePorts ports(queue, std::move(directory));
-    auto factory = sourceFactory(options.recording, queue);
-    if (!factory) {
-        complain(factory.error().sentence);
+    LastWords lastWords(queue);
+    std::unique_ptr<TelephonyServer> server;
+    int status = 0;
+    const auto program = programOf(options, queue, [&](bool isOrderly) {
+        status = isOrderly ? 0 : 1;
+        lastWords.begin(*server);
+    });
+    if (!program) {
+        complain(program.error().sentence);
         return 1;
     }
     queue.onSignal({SIGINT, SIGTERM}, [&queue](int /*signal*/) { queue.stop(); });
-    auto server = TelephonyServer::start({queue, ports, options.controlPortName,
-                                          std::move(factory).value(), options.play, complain});
-    if (!server) {
-        complain(server.error().sentence);
+    auto started = TelephonyServer::start(serverSetup(options, queue, ports, *program));
+    if (!started) {
+        complain(started.error().sentence);
         return 1;
     }
+    server = std::move(started).value();
     if (ready) {
         ready();
     }
     queue.run();
-    return 0;
+    return status;
 }
 
 } // namespace
@@ -96,6 +165,25 @@ int runService(const ServiceOptions& options, const std::function<void()>& ready
         return 1;
     }
     return serve(options, ready, std::move(directory).value());
+}
+
+int printServiceStatus() {
+    auto directory = SocketDirectory::open();
+    if (!directory) {
+        complain(directory.error().sentence);
+        return 1;
+    }
+    AsioMainQueue queue;
+    SocketMessagePorts ports(queue, std::move(directory).value());
+    const auto status = askStatus(ports, std::string(kTelephonyControlPort));
+    if (!status) {
+        complain(status.error().sentence);
+        return 1;
+    }
+    const std::string text = statusText(*status);
+    const bool isPrinted =
+        std::fwrite(text.data(), 1, text.size(), stdout) == text.size() && std::fflush(stdout) == 0;
+    return isPrinted ? 0 : 1;
 }
 
 } // namespace pallax

@@ -15,6 +15,11 @@ struct ServiceOptions {
     std::string recording; ///< path, "-" for standard input (played once, to the first channel)
     PlayOptions play;
     std::string controlPortName = std::string(kTelephonyControlPort);
+    /// The recording is a live stream: it goes on to every client as it comes, and the service
+    /// ends with it.
+    bool relay = false;
+    /// Every client sets its own pace and loses nothing, whatever the speed.
+    bool lossless = false;
 };
 
 /// "1.5", "max": how options say a speed.
@@ -22,8 +27,13 @@ std::string speedText(double speed);
 /// Nothing for what is no positive number and not "max".
 std::optional<double> parseSpeed(const std::string& text);
 
-/// Runs the service until SIGINT or SIGTERM, then returns 0. A failure is one sentence on
-/// standard error and the result 1. `ready`, if any, is called once clients can connect.
+/// Runs the service until SIGINT or SIGTERM, or the orderly end of what it relays, then returns 0.
+/// A failure is one sentence on standard error and the result 1. `ready`, if any, is called once
+/// clients can connect.
 int runService(const ServiceOptions& options, const std::function<void()>& ready = {});
+
+/// Prints what the running service says of itself. Without one, a sentence on standard error and
+/// the result 1.
+int printServiceStatus();
 
 } // namespace pallax

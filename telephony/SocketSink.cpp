@@ -8,32 +8,69 @@
 
 namespace pallax {
 
-std::unique_ptr<SocketSink> SocketSink::connect(AsioMainQueue& queue,
-                                                const SocketDirectory& directory,
-                                                std::string_view portName,
-                                                std::function<void()> closed) {
+std::unique_ptr<SocketSink> SocketSink::connect(Setup setup, const SocketDirectory& directory,
+                                                std::string_view portName) {
     const auto path = directory.socketPath(portName);
     Descriptor socket = path ? connectTo(*path) : Descriptor();
     if (!socket) {
         return nullptr;
     }
-    return std::unique_ptr<SocketSink>(new SocketSink(queue, std::move(socket), std::move(closed)));
+    return std::unique_ptr<SocketSink>(new SocketSink(std::move(setup), std::move(socket)));
 }
 
-SocketSink::SocketSink(AsioMainQueue& queue, Descriptor socket, std::function<void()> closed)
-    : _queue(queue), _socket(std::move(socket)), _watch(queue, _socket.number()),
-      _closed(std::move(closed)), _alive(std::make_shared<SocketSink*>(this)) {
+SocketSink::SocketSink(Setup setup, Descriptor socket)
+    : _setup(std::move(setup)), _socket(std::move(socket)), _watch(_setup.queue, _socket.number()),
+      _alive(std::make_shared<SocketSink*>(this)) {
     watchReceiver();
 }
 
 void SocketSink::write(const FrameHeader& header, Bytes data) {
-    appendFrame(_chunk, header, data);
+    const bool isPacket = header.kind == FrameKind::Message;
+    const std::size_t size = kFrameHeaderSize + data.size();
+    if (header.kind != FrameKind::End && !hasRoomFor(size)) {
+        if (isPacket) {
+            drop();
+        }
+        return; // of a time that is left out, a later one tells
+    }
+    appendFrame(_next, header, data);
+    _unflushed += size;
+    _holdsEnd = _holdsEnd || header.kind == FrameKind::End;
+    _packets += isPacket ? 1U : 0U;
+}
+
+/// What is larger than all the room finds room alone.
+bool SocketSink::hasRoomFor(std::size_t size) const {
+    const std::size_t waiting = _chunk.size() - _chunkSent + _next.size();
+    return !_setup.mostWaiting || waiting == 0 || waiting + size <= *_setup.mostWaiting;
+}
+
+void SocketSink::drop() {
+    ++_dropped;
+    if (!std::exchange(_isBehind, true)) {
+        _droppedBefore = _dropped - 1;
+        if (_setup.lost) {
+            _setup.lost(0);
+        }
+    }
+}
+
+void SocketSink::caughtUp() {
+    if (std::exchange(_isBehind, false) && _setup.lost) {
+        _setup.lost(_dropped - _droppedBefore);
+    }
 }
 
 void SocketSink::flush(std::function<void()> done) {
-    _done = std::move(done);
-    _sent = 0;
-    send();
+    _unflushed = 0;
+    if (_setup.mostWaiting && !_holdsEnd) {
+        _setup.queue.async(std::move(done));
+    } else {
+        _done = std::move(done);
+    }
+    if (!_isSending) {
+        sendNext();
+    }
 }
 
 /// The receiver sends nothing on this connection; what can be read is its end.
@@ -48,9 +85,17 @@ void SocketSink::watchReceiver() {
     });
 }
 
+void SocketSink::sendNext() {
+    _chunk.swap(_next);
+    _next.clear();
+    _chunkSent = 0;
+    _isSending = true;
+    send();
+}
+
 void SocketSink::send() {
-    while (_sent < _chunk.size()) {
-        const Transfer transfer = sendTo(_socket, Bytes(_chunk).subspan(_sent));
+    while (_chunkSent < _chunk.size()) {
+        const Transfer transfer = sendTo(_socket, Bytes(_chunk).subspan(_chunkSent));
         if (transfer.state == Transfer::State::Closed) {
             return; // the watch for reading tells it
         }
@@ -58,20 +103,30 @@ void SocketSink::send() {
             _watch.onceWritable([this] { send(); });
             return;
         }
-        _sent += transfer.count;
+        _chunkSent += transfer.count;
+        if (_chunkSent == _chunk.size() && !_next.empty()) {
+            _chunk.swap(_next);
+            _next.clear();
+            _chunkSent = 0;
+        }
     }
     _chunk.clear();
-    _queue.async([weak = std::weak_ptr<SocketSink*>(_alive)] {
-        if (const auto sink = weak.lock()) {
-            if (const auto done = std::exchange((*sink)->_done, {})) {
-                done();
+    _chunkSent = 0;
+    _isSending = false;
+    caughtUp();
+    if (_done) {
+        _setup.queue.async([weak = std::weak_ptr<SocketSink*>(_alive)] {
+            if (const auto sink = weak.lock()) {
+                if (const auto done = std::exchange((*sink)->_done, {})) {
+                    done();
+                }
             }
-        }
-    });
+        });
+    }
 }
 
 void SocketSink::close() {
-    if (const auto closed = std::exchange(_closed, {})) {
+    if (const auto closed = std::exchange(_setup.closed, {})) {
         closed();
     }
 }

@@ -4,38 +4,67 @@
 #include "host/Descriptor.h"
 #include "telephony/PacketSink.h"
 
+#include <cstddef>
+#include <cstdint>
 #include <memory>
+#include <optional>
 
 namespace pallax {
 
 class SocketDirectory;
 
 /// The connection of a log channel to the local port that it feeds.
+///
+/// Either the receiver sets the pace, and nothing is lost; or the sink takes what comes, up to a
+/// bound, whatever the receiver does: packets that find no room are dropped and counted. The end
+/// of the source always waits for the receiver.
 class SocketSink final : public PacketSink {
 public:
-    /// Null when nobody listens under that name. `closed` is called once, as a block, when the
-    /// receiver ends the connection; it may destroy the sink.
-    static std::unique_ptr<SocketSink> connect(AsioMainQueue& queue,
-                                               const SocketDirectory& directory,
-                                               std::string_view portName,
-                                               std::function<void()> closed);
+    struct Setup {
+        AsioMainQueue& queue;
+        /// Bytes that may wait for a receiver that is slow; nothing: the receiver sets the pace.
+        std::optional<std::size_t> mostWaiting;
+        /// Called once, as a block, when the receiver ends the connection; it may destroy the sink.
+        std::function<void()> closed;
+        /// Called when the first packet is dropped, with 0, and when the receiver has caught up
+        /// again, with the number of packets that were dropped meanwhile.
+        std::function<void(std::uint64_t count)> lost;
+    };
+
+    /// Null when nobody listens under that name.
+    static std::unique_ptr<SocketSink> connect(Setup setup, const SocketDirectory& directory,
+                                               std::string_view portName);
 
     void write(const FrameHeader& header, Bytes data) override;
-    std::size_t pending() const override { return _chunk.size(); }
+    std::size_t pending() const override { return _unflushed; }
     void flush(std::function<void()> done) override;
 
+    std::uint64_t sent() const { return _packets; }    ///< packets, those included that wait
+    std::uint64_t dropped() const { return _dropped; } ///< packets
+
 private:
-    SocketSink(AsioMainQueue& queue, Descriptor socket, std::function<void()> closed);
+    SocketSink(Setup setup, Descriptor socket);
+    bool hasRoomFor(std::size_t size) const;
+    void drop();
+    void caughtUp();
     void watchReceiver();
+    void sendNext();
     void send();
     void close();
 
-    AsioMainQueue& _queue;
+    Setup _setup;
     Descriptor _socket;
-    DescriptorWatch _watch; // after the socket that it watches
-    std::function<void()> _closed;
-    ByteBuffer _chunk;
-    std::size_t _sent = 0;
+    DescriptorWatch _watch;     // after the socket that it watches
+    ByteBuffer _chunk;          // under way
+    std::size_t _chunkSent = 0; // bytes of it
+    bool _isSending = false;
+    ByteBuffer _next; // what comes behind it
+    std::size_t _unflushed = 0;
+    bool _holdsEnd = false;
+    std::uint64_t _packets = 0;
+    std::uint64_t _dropped = 0;
+    std::uint64_t _droppedBefore = 0; // before the receiver fell behind
+    bool _isBehind = false;
     std::function<void()> _done;
     std::shared_ptr<SocketSink*> _alive; // blocks hold it weakly
 };

@@ -5,6 +5,7 @@
 #include "platform/Format.h"
 #include "telephony/ServedChannel.h"
 
+#include <algorithm>
 #include <cerrno>
 
 namespace pallax {
@@ -28,12 +29,16 @@ Result<std::unique_ptr<TelephonyServer>, HostError> TelephonyServer::start(Setup
     return server;
 }
 
-TelephonyServer::TelephonyServer(Setup setup) : _setup(std::move(setup)) {}
+TelephonyServer::TelephonyServer(Setup setup)
+    : _setup(std::move(setup)), _started(_setup.steadyNow()) {}
 
 TelephonyServer::~TelephonyServer() = default;
 
 std::optional<ByteBuffer> TelephonyServer::answer(Bytes request) {
     const auto message = decodeMessage(request);
+    if (message && isStatusRequest(*message)) {
+        return encodeMessage(statusReply(status()));
+    }
     const auto localPort = message ? stringIn(*message, "CreateLogChannel") : std::nullopt;
     const LogChannel channel =
         localPort ? createLogChannel(*localPort) : LogChannel{kServiceErrorDomain, EINVAL, {}};
@@ -51,8 +56,9 @@ LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
     std::unique_ptr<ServedChannel> channel;
     const int error = ServedChannel::open(
         ServedChannel::Setup{_setup.queue, _setup.ports, portName, localPortName,
-                             std::move(source).value(), _setup.options,
-                             [this, number] { _channels.erase(number); },
+                             std::move(source).value(), _setup.options, _setup.mostWaiting,
+                             [this](const std::string& sentence) { report(sentence); },
+                             [this, number] { removeChannel(number); },
                              [this](const std::string& failure) {
                                  if (!failure.empty()) {
                                      report(failure);
@@ -64,6 +70,38 @@ LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
     }
     _channels.emplace(number, std::move(channel));
     return {0, 0, std::move(portName)};
+}
+
+void TelephonyServer::removeChannel(int number) {
+    const auto found = _channels.find(number);
+    if (found == _channels.end()) {
+        return;
+    }
+    const ServiceStatus::Client last = found->second->status();
+    _sentBefore += last.sent;
+    _droppedBefore += last.dropped;
+    if (last.dropped > 0) {
+        report(formatText("%@ has gone: of its packets %lld were sent and %lld dropped.",
+                          {last.localPort, last.sent, last.dropped}));
+    }
+    _channels.erase(found);
+}
+
+bool TelephonyServer::isStreaming() const {
+    return std::any_of(_channels.begin(), _channels.end(),
+                       [](const auto& entry) { return entry.second->isStreaming(); });
+}
+
+ServiceStatus TelephonyServer::status() const {
+    const auto uptime =
+        std::chrono::duration_cast<std::chrono::seconds>(_setup.steadyNow() - _started);
+    ServiceStatus status{_setup.technology, uptime.count(), _sentBefore, _droppedBefore, {}};
+    for (const auto& entry : _channels) {
+        status.clients.push_back(entry.second->status());
+        status.sent += status.clients.back().sent;
+        status.dropped += status.clients.back().dropped;
+    }
+    return status;
 }
 
 void TelephonyServer::report(const std::string& sentence) const {

@@ -6,10 +6,14 @@
 #include "telephony/ControlMessages.h"
 #include "telephony/PacketPlayer.h"
 #include "telephony/PacketSource.h"
+#include "telephony/ServiceStatus.h"
 
+#include <chrono>
+#include <cstddef>
 #include <functional>
 #include <map>
 #include <memory>
+#include <optional>
 #include <string>
 
 namespace pallax {
@@ -23,14 +27,25 @@ class SocketMessagePorts;
 /// channels, each with a source and a port of its own. Its destruction ends them all.
 class TelephonyServer {
 public:
+    using SteadyNow = std::function<std::chrono::steady_clock::time_point()>;
+
+    /// The bytes that wait for a slow client where packets come in their own time.
+    static constexpr std::size_t kMostWaiting = std::size_t{1} << 20U;
+
     struct Setup {
         AsioMainQueue& queue;
         SocketMessagePorts& ports;
         std::string controlPortName = std::string(kTelephonyControlPort);
         PacketSourceFactory makeSource;
         PlayOptions options;
-        /// Hears, as one sentence, what goes wrong with a source once channels are served.
+        /// Hears, as one sentence, what goes wrong with a source or a client once channels are
+        /// served.
         std::function<void(const std::string& sentence)> report;
+        /// What the sources are of, for the status.
+        std::string technology = {};
+        /// See SocketSink; nothing: no client loses anything, each at its own pace.
+        std::optional<std::size_t> mostWaiting = std::nullopt;
+        SteadyNow steadyNow = std::chrono::steady_clock::now;
     };
 
     /// Fails when the control port cannot be made, or a living service has that name.
@@ -40,17 +55,24 @@ public:
     TelephonyServer& operator=(const TelephonyServer&) = delete;
 
     std::size_t channelCount() const { return _channels.size(); }
+    /// True while a client that has started its stream has not been told its end.
+    bool isStreaming() const;
+    ServiceStatus status() const;
 
 private:
     explicit TelephonyServer(Setup setup);
     std::optional<ByteBuffer> answer(Bytes request);
     LogChannel createLogChannel(const std::string& localPortName);
+    void removeChannel(int number);
     void report(const std::string& sentence) const;
 
     Setup _setup;
     std::unique_ptr<LocalMessagePort> _control;
     std::map<int, std::unique_ptr<ServedChannel>> _channels; // by number
     int _latestNumber = 0;
+    std::chrono::steady_clock::time_point _started;
+    std::int64_t _sentBefore = 0;    // to clients that have gone
+    std::int64_t _droppedBefore = 0; // likewise
 };
 
 } // namespace pallax

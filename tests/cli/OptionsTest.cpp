@@ -105,8 +105,37 @@ TEST(Options, ServicePlaysARecording) {
     EXPECT_TRUE(options.play.loop);
 }
 
+TEST(Options, ServiceRelaysStandardInput) {
+    const auto options = parsed<ServiceOptions>({"service", "--relay", "-"});
+    EXPECT_EQ(options.recording, "-");
+    EXPECT_TRUE(options.relay);
+    EXPECT_FALSE(parsed<ServiceOptions>({"service", "--play", "-"}).relay);
+}
+
+TEST(Options, ServiceTellsItsStatus) {
+    (void)parsed<ServiceStatusOptions>({"service", "--status"});
+}
+
+TEST(Options, RecordWritesOneFileAndKeepsWhatExistsUnlessToldOtherwise) {
+    const auto plain = parsed<RecordOptions>({"record", "a.pcapng"});
+    EXPECT_EQ(plain.files.path, "a.pcapng");
+    EXPECT_EQ(plain.files.existing, PcapNgWriter::Existing::Keep);
+    EXPECT_FALSE(plain.files.rotates());
+    EXPECT_EQ(plain.technology, nullptr);
+    EXPECT_EQ(plain.logLevel, std::nullopt);
+
+    const auto told = parsed<RecordOptions>({"record", "--technology", "utran", "--rotate-size",
+                                             "64k", "--rotate-seconds", "1.5", "--overwrite",
+                                             "--log-level", "6", "a.pcapng"});
+    EXPECT_EQ(told.technology->identifier, "Zorell_UTRAN2");
+    EXPECT_EQ(told.files.rotateSize, 65536U);
+    EXPECT_EQ(told.files.rotateAfter, std::chrono::milliseconds(1500));
+    EXPECT_EQ(told.files.existing, PcapNgWriter::Existing::Overwrite);
+    EXPECT_EQ(told.logLevel, 6);
+}
+
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
-    for (const char* command : {"", "decode", "service"}) {
+    for (const char* command : {"", "decode", "record", "service"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);
@@ -138,13 +167,36 @@ TEST(Options, WrongUsageIsOneClearSentence) {
               "pallax: --speed: \"0\" is neither a number above 0 nor max (pallax --help tells "
               "more)\n");
     EXPECT_EQ(wrongUsage({"decode"}), "pallax: RECORDING is required (pallax --help tells more)\n");
-    EXPECT_EQ(wrongUsage({"service"}), "pallax: --play is required (pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"service"}),
+              "pallax: the service needs --play, --relay or --status (pallax --help tells more)\n");
     EXPECT_EQ(wrongUsage({"a", "decode", "b"}),
               "pallax: the command \"decode\" must come first, without options before it (pallax "
               "--help tells more)\n");
     EXPECT_EQ(wrongUsage({"--print", "decode", "b"}),
               "pallax: the command \"decode\" must come first, without options before it (pallax "
               "--help tells more)\n");
+}
+
+TEST(Options, WrongUsageOfTheServiceAndTheRecorderIsOneClearSentence) {
+    EXPECT_EQ(wrongUsage({"service", "--relay", "a.pcap"}),
+              "pallax: --relay: only -, standard input, can be relayed (pallax --help tells "
+              "more)\n");
+    EXPECT_EQ(wrongUsage({"service", "--relay", "-", "--play", "a"}),
+              "pallax: --play excludes --relay (pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"service", "--status", "--play", "a"}),
+              "pallax: --play excludes --status (pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"record"}), "pallax: FILE is required (pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"record", "--rotate-size", "0", "a"}),
+              "pallax: --rotate-size: \"0\" is no size like 4096, 64k, 100M or 2G (pallax --help "
+              "tells more)\n");
+    for (const char* seconds : {"0", "-1", "nan", "1e10"}) {
+        EXPECT_EQ(wrongUsage({"record", "--rotate-seconds", seconds, "a"}),
+                  "pallax: --rotate-seconds: it takes a number above 0 (pallax --help tells "
+                  "more)\n");
+    }
+    EXPECT_EQ(wrongUsage({"record", "--rotate-size", "1M", "-"}),
+              "pallax: standard output is one recording, without --rotate-size and "
+              "--rotate-seconds (pallax --help tells more)\n");
 }
 
 TEST(Options, WhatNobodyKnowsIsNamed) {

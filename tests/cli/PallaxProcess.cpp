@@ -75,9 +75,9 @@ std::vector<char*> pointersTo(std::vector<std::string>& texts) {
 }
 
 std::vector<std::string> programEnvironment(const World& world) {
-    std::vector<std::string> environment{"XDG_RUNTIME_DIR=" + world.folder().string(),
-                                         "XDG_CONFIG_HOME=" + world.path("config"), "TZ=UTC"};
-    environment.insert(environment.end(), world.environment.begin(), world.environment.end());
+    std::vector<std::string> environment = world.environment; // of two, the first is seen
+    environment.insert(environment.end(), {"XDG_RUNTIME_DIR=" + world.folder().string(),
+                                           "XDG_CONFIG_HOME=" + world.path("config"), "TZ=UTC"});
     return environment;
 }
 

@@ -24,7 +24,7 @@ public:
     /// The sockets there are now, sorted.
     std::vector<std::string> sockets() const;
 
-    /// More of the environment that programs in it see, NAME=VALUE.
+    /// More of the environment that programs in it see, NAME=VALUE; it goes before the world's.
     std::vector<std::string> environment;
 
 private:

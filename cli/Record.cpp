@@ -1,0 +1,89 @@
+#include "cli/Preconditions.h"
+#include "cli/Programs.h"
+#include "cli/Recorder.h"
+#include "cli/ScopedLog.h"
+#include "cli/TeeSink.h"
+#include "host/LogSinks.h"
+#include "platform/Format.h"
+
+#include <algorithm>
+#include <csignal>
+#include <cstdio>
+#include <unistd.h>
+
+namespace pallax {
+
+namespace {
+
+/// What the machine's log gets: failures.
+constexpr int kSyslogLevel = static_cast<int>(LogPriority::Error);
+constexpr int kNothing = -1;
+
+/// One line of the terminal that is written again and again.
+class ProgressLine {
+public:
+    void show(const std::string& text) {
+        if (_isTerminal) {
+            _isShown = true;
+            (void)std::fprintf(stderr, "\r%s\033[K", text.c_str());
+        }
+    }
+    /// What is shown stays; what follows stands below.
+    void end() {
+        if (_isShown) {
+            (void)std::fputc('\n', stderr);
+        }
+    }
+
+private:
+    bool _isTerminal = ::isatty(STDERR_FILENO) != 0;
+    bool _isShown = false;
+};
+
+ExitStatus record(const RecordOptions& options) {
+    if (const auto missing = missingTemplates()) {
+        complain(*missing);
+        return kExitFailure;
+    }
+    auto directory = SocketDirectory::open();
+    if (!directory) {
+        complain(directory.error().sentence);
+        return kExitFailure;
+    }
+    const auto files = RecordingFiles::open(options.files);
+    if (!files) {
+        complain(files.error().sentence);
+        return kExitFailure;
+    }
+    ProgressLine progress;
+    std::optional<std::string> failure;
+    {
+        Recorder recorder(std::move(directory).value(), options.technology, **files,
+                          [&progress](const std::string& text) { progress.show(text); });
+        failure = recorder.run();
+    }
+    progress.end();
+    if ((*files)->tooLarge() > 0) {
+        complain(formatText("%llu packets of more than %zu bytes were left out.",
+                            {(*files)->tooLarge(), PcapNgWriter::kLargestPacket}));
+    }
+    if (failure) {
+        complain(*failure);
+        return kExitFailure;
+    }
+    return kExitSuccess;
+}
+
+} // namespace
+
+ExitStatus runRecord(const RecordOptions& options) {
+    (void)std::signal(SIGXFSZ, SIG_IGN); // a file that may not grow is an error of write
+    SyslogSink syslog("pallax");
+    StderrSink standardError;
+    const int wanted = options.logLevel.value_or(kNothing);
+    TeeSink both(syslog, kSyslogLevel, standardError, wanted);
+    const ScopedLog log(both, std::max(kSyslogLevel, wanted));
+    return record(options);
+}
+
+} // namespace pallax

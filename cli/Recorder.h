@@ -1,0 +1,61 @@
+#pragma once
+
+#include "cli/BrowseLink.h"
+#include "cli/RecordOptions.h"
+#include "cli/RecordingFiles.h"
+#include "cli/RecordingPorts.h"
+#include "monitor/PallaxModel.h"
+#include "platform/StandardOutput.h"
+
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace pallax {
+
+/// Records what a viewer would be shown: a model opens the log channel and keeps it open, and the
+/// packets go into files instead of into a display, each with its source's time.
+class Recorder final : private LinkListener, private ModelObserver {
+public:
+    /// Gets, about once a second, how far it has come.
+    using Progress = std::function<void(const std::string& text)>;
+
+    Recorder(SocketDirectory directory, const RecordedTechnology* wanted, RecordingFiles& files,
+             Progress progress);
+
+    /// Records until a signal, the source's end or a failure: nothing, or the failure's sentence.
+    std::optional<std::string> run();
+
+    /// "120 packets, 4800 bytes, 50 packets/s", or that there is no modem yet.
+    static std::string progressText(const RecordingFiles& files, std::uint64_t packetsPerSecond,
+                                    bool isConnected);
+
+private:
+    class NoNotices final : public StandardOutput {
+    public:
+        void printLine(std::string_view /*line*/) override {}
+    };
+
+    bool replied(Bytes reply) override;
+    void packetArrived(Bytes packet) override;
+    void updateViewControllerFromModel() override {}
+    PallaxModel::Platform platform();
+    void tellProgress();
+    void fail(std::string sentence);
+
+    const RecordedTechnology* _wanted;
+    RecordingFiles& _files;
+    Progress _progress;
+    const RecordedTechnology* _technology = nullptr; // that the modem has answered
+    std::optional<std::string> _failure;
+    std::uint64_t _packetsTold = 0;
+    NoNotices _notices;
+    BrowseLink _link;
+    PallaxModel::Platform _browsing;
+    RecordingPorts _ports;
+    PallaxModel _model;
+};
+
+} // namespace pallax

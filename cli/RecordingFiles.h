@@ -1,0 +1,58 @@
+#pragma once
+
+#include "host/PcapNgWriter.h"
+
+#include <chrono>
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace pallax {
+
+struct RecordedTechnology;
+
+/// The files of one recording run. Without a limit it is one file, of the given name. With a
+/// limit, a number stands before the name's extension ("drive.pcapng": "drive-0001.pcapng",
+/// "drive-0002.pcapng", …), and the next file begins where a packet would pass the limit.
+class RecordingFiles {
+public:
+    struct Options {
+        std::string path; ///< "-" is standard output, which takes no limit
+        PcapNgWriter::Existing existing = PcapNgWriter::Existing::Keep;
+        std::optional<std::uint64_t> rotateSize;             ///< bytes that a file may have
+        std::optional<std::chrono::nanoseconds> rotateAfter; ///< of the packets' own time
+
+        bool rotates() const { return rotateSize || rotateAfter; }
+    };
+
+    /// Opens the first file; fails where it exists already and is to be kept.
+    static Result<std::unique_ptr<RecordingFiles>, HostError> open(const Options& options);
+
+    /// Nothing when the packet is in the file; else why it is not, and recording is over. A packet
+    /// above PcapNgWriter::kLargestPacket is left out and counted.
+    std::optional<HostError> add(const RecordedTechnology& technology, Time time, Bytes packet);
+
+    std::uint64_t packets() const { return _packets; } ///< written, over all files
+    std::uint64_t bytes() const { return _bytes; }     ///< of those packets themselves
+    std::uint64_t tooLarge() const { return _tooLarge; }
+
+    /// The name of the file with that number.
+    static std::string numberedPath(const std::string& path, unsigned number);
+
+private:
+    RecordingFiles(Options options, std::unique_ptr<PcapNgWriter> file)
+        : _options(std::move(options)), _file(std::move(file)) {}
+    bool isFull(Time time, std::size_t length) const;
+    std::optional<HostError> nextFile();
+
+    Options _options;
+    std::unique_ptr<PcapNgWriter> _file;
+    unsigned _number = 1;       // of that file
+    std::optional<Time> _begin; // of its first packet
+    std::uint64_t _packets = 0;
+    std::uint64_t _bytes = 0;
+    std::uint64_t _tooLarge = 0;
+};
+
+} // namespace pallax

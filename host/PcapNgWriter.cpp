@@ -1,0 +1,185 @@
+#include "host/PcapNgWriter.h"
+
+#include "platform/Format.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <cstring>
+#include <fcntl.h>
+#include <sys/stat.h>
+
+// A block of a pcapng file is its type, its whole length, its body, which is padded to a multiple
+// of 4 bytes, and its length again. The bodies, offsets in bytes:
+//
+//   section header     0 byte-order magic, 4 version, 8 length of the section (unknown), options
+//   interface          0 link type (16 bits), 4 largest packet, options
+//   enhanced packet    0 interface, 4 stamp (high half first), 12 length here, 16 as it was, data
+//
+// An option is its number and its length (16 bits each) and its value, padded to 4 bytes.
+
+namespace pallax {
+
+namespace {
+
+constexpr std::uint32_t kSectionHeader = 0x0A0D0D0A;
+constexpr std::uint32_t kInterface = 1;
+constexpr std::uint32_t kEnhancedPacket = 6;
+
+constexpr std::uint16_t kEndOfOptions = 0;
+constexpr std::uint16_t kInterfaceName = 2;
+constexpr std::uint16_t kSectionProgram = 4;
+constexpr std::uint16_t kStampResolution = 9;
+
+constexpr char kNanoseconds = 9; // the stamps count units of 10 to the power of -9 s
+constexpr unsigned kBitsPerByte = 8;
+constexpr std::size_t kAlignment = 4;
+constexpr std::size_t kBlockFrame = 12; // type and both lengths
+constexpr std::size_t kPacketHead = 20; // of an enhanced packet's body, before the data
+
+std::size_t padded(std::size_t length) {
+    return (length + kAlignment - 1) / kAlignment * kAlignment;
+}
+
+/// Puts a block together.
+class Block {
+public:
+    Block(std::uint32_t type, std::size_t bodySize) {
+        _bytes.reserve(kBlockFrame + padded(bodySize));
+        u32(type).u32(0);
+    }
+
+    Block& u16(std::uint16_t number) { return put(number, sizeof number); }
+    Block& u32(std::uint32_t number) { return put(number, sizeof number); }
+    Block& data(Bytes bytes) {
+        _bytes.insert(_bytes.end(), bytes.begin(), bytes.end());
+        _bytes.resize(padded(_bytes.size()));
+        return *this;
+    }
+    Block& option(std::uint16_t number, std::string_view value) {
+        const ByteBuffer bytes(value.begin(), value.end());
+        return u16(number).u16(static_cast<std::uint16_t>(bytes.size())).data(bytes);
+    }
+    /// The whole block.
+    ByteBuffer finish() {
+        constexpr std::size_t kLengthAt = 4;
+        const auto length = static_cast<std::uint32_t>(_bytes.size() + sizeof(std::uint32_t));
+        u32(length);
+        std::copy_n(_bytes.end() - kLengthAt, kLengthAt, _bytes.begin() + kLengthAt);
+        return std::move(_bytes);
+    }
+
+private:
+    Block& put(std::uint64_t number, std::size_t width) {
+        for (std::size_t index = 0; index < width; ++index) {
+            _bytes.push_back(static_cast<std::uint8_t>(number >> (index * kBitsPerByte)));
+        }
+        return *this;
+    }
+
+    ByteBuffer _bytes;
+};
+
+ByteBuffer sectionHeader() {
+    constexpr std::uint32_t kByteOrderMagic = 0x1A2B3C4D;
+    constexpr std::uint32_t kVersion = 1; // 1.0, each half a 16-bit number
+    constexpr std::uint32_t kUnknown = 0xFFFFFFFF;
+    constexpr std::size_t kRoughSize = 32;
+    return Block(kSectionHeader, kRoughSize)
+        .u32(kByteOrderMagic)
+        .u32(kVersion)
+        .u32(kUnknown)
+        .u32(kUnknown)
+        .option(kSectionProgram, "pallax")
+        .option(kEndOfOptions, {})
+        .finish();
+}
+
+HostError failureOf(std::string_view name, int error) {
+    return {formatText("The recording %@ cannot be written: %@.", {name, std::strerror(error)})};
+}
+
+} // namespace
+
+Result<std::unique_ptr<PcapNgWriter>, HostError> PcapNgWriter::create(const std::string& path,
+                                                                      Existing existing) {
+    constexpr mode_t kMode = S_IRUSR | S_IWUSR | S_IRGRP | S_IROTH;
+    const bool toOutput = path == "-";
+    const int always = O_WRONLY | O_CREAT | O_CLOEXEC;
+    const int flags = always | (existing == Existing::Keep ? O_EXCL : O_TRUNC);
+    Descriptor file(toOutput ? -1 : ::open(path.c_str(), flags, kMode));
+    if (!toOutput && !file) {
+        return errno == EEXIST
+                   ? HostError{formatText("%@ exists already; --overwrite replaces it.", {path})}
+                   : failureOf(path, errno);
+    }
+    const int number = toOutput ? STDOUT_FILENO : file.number();
+    std::unique_ptr<PcapNgWriter> writer(
+        new PcapNgWriter(toOutput ? "standard output" : path, std::move(file), number));
+    if (auto error = writer->put(sectionHeader())) {
+        return std::move(*error);
+    }
+    return writer;
+}
+
+Result<std::uint32_t, HostError> PcapNgWriter::interfaceFor(int linkType, std::string_view name) {
+    const auto found = _interfaces.find(name);
+    if (found != _interfaces.end()) {
+        return found->second;
+    }
+    const std::size_t roughSize = 32 + name.size();
+    const auto block = Block(kInterface, roughSize)
+                           .u16(static_cast<std::uint16_t>(linkType))
+                           .u16(0)
+                           .u32(kLargestPacket)
+                           .option(kInterfaceName, name)
+                           .option(kStampResolution, {&kNanoseconds, 1})
+                           .option(kEndOfOptions, {})
+                           .finish();
+    if (auto error = put(block)) {
+        return std::move(*error);
+    }
+    const auto number = static_cast<std::uint32_t>(_interfaces.size());
+    _interfaces.emplace(name, number);
+    return number;
+}
+
+std::uint64_t PcapNgWriter::sizeOfPacket(std::size_t length) {
+    return kBlockFrame + kPacketHead + padded(length);
+}
+
+std::optional<HostError> PcapNgWriter::write(std::uint32_t interface, Time time, Bytes packet) {
+    constexpr unsigned kHalf = 32;
+    const auto sinceEpoch = std::max<std::int64_t>(time.time_since_epoch().count(), 0);
+    const auto stamp = static_cast<std::uint64_t>(sinceEpoch);
+    const auto length = static_cast<std::uint32_t>(packet.size());
+    return put(Block(kEnhancedPacket, kPacketHead + packet.size())
+                   .u32(interface)
+                   .u32(static_cast<std::uint32_t>(stamp >> kHalf))
+                   .u32(static_cast<std::uint32_t>(stamp))
+                   .u32(length)
+                   .u32(length)
+                   .data(packet)
+                   .finish());
+}
+
+std::optional<HostError> PcapNgWriter::put(const ByteBuffer& block) {
+    std::size_t written = 0;
+    while (written < block.size()) {
+        const ssize_t count = ::write(_number, block.data() + written, block.size() - written);
+        if (count < 0 && errno == EINTR) {
+            continue;
+        }
+        if (count <= 0) {
+            const int error = count < 0 ? errno : ENOSPC;
+            if (_file) { // standard output's reader has the rest already
+                (void)!::ftruncate(_number, static_cast<off_t>(_size));
+            }
+            return failureOf(_name, error);
+        }
+        written += static_cast<std::size_t>(count);
+    }
+    _size += block.size();
+    return std::nullopt;
+}
+
+} // namespace pallax

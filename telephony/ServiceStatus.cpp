@@ -1,0 +1,112 @@
+#include "telephony/ServiceStatus.h"
+
+#include "platform/Format.h"
+#include "platform/MessagePort.h"
+#include "telephony/ControlMessages.h"
+
+#include <chrono>
+
+namespace pallax {
+
+namespace {
+
+constexpr const char* kRequest = "GetStatus";
+
+std::optional<std::int64_t> countIn(const Dictionary& message, std::string_view key) {
+    const PropertyList* value = message.find(key);
+    return value != nullptr ? value->integer() : std::nullopt;
+}
+
+std::optional<ServiceStatus::Client> parseClient(const PropertyList& element) {
+    const DictionaryRef entry = element.dictionary();
+    if (entry == nullptr) {
+        return std::nullopt;
+    }
+    const auto localPort = stringIn(*entry, "LocalPort");
+    const PropertyList* streaming = entry->find("Streaming");
+    const auto isStreaming = streaming != nullptr ? streaming->boolean() : std::nullopt;
+    const auto sent = countIn(*entry, "Sent");
+    const auto dropped = countIn(*entry, "Dropped");
+    if (!localPort || !isStreaming || !sent || !dropped) {
+        return std::nullopt;
+    }
+    return ServiceStatus::Client{*localPort, *isStreaming, *sent, *dropped};
+}
+
+} // namespace
+
+Dictionary statusRequest() {
+    return {{kRequest, kRequest}};
+}
+
+bool isStatusRequest(const Dictionary& message) {
+    return stringIn(message, kRequest) == kRequest;
+}
+
+Dictionary statusReply(const ServiceStatus& status) {
+    Array clients;
+    for (const ServiceStatus::Client& client : status.clients) {
+        clients.emplace_back(Dictionary{{"LocalPort", client.localPort},
+                                        {"Streaming", PropertyList::boolean(client.isStreaming)},
+                                        {"Sent", PropertyList::integer(client.sent)},
+                                        {"Dropped", PropertyList::integer(client.dropped)}});
+    }
+    return {{"Technology", status.technology},
+            {"Uptime", PropertyList::integer(status.uptimeSeconds)},
+            {"Sent", PropertyList::integer(status.sent)},
+            {"Dropped", PropertyList::integer(status.dropped)},
+            {"Clients", std::move(clients)}};
+}
+
+std::optional<ServiceStatus> parseStatusReply(const Dictionary& reply) {
+    const auto technology = stringIn(reply, "Technology");
+    const auto uptime = countIn(reply, "Uptime");
+    const auto sent = countIn(reply, "Sent");
+    const auto dropped = countIn(reply, "Dropped");
+    const PropertyList* list = reply.find("Clients");
+    const ArrayRef clients = list != nullptr ? list->array() : nullptr;
+    if (!technology || !uptime || !sent || !dropped || clients == nullptr) {
+        return std::nullopt;
+    }
+    ServiceStatus status{*technology, *uptime, *sent, *dropped, {}};
+    for (const PropertyList& element : *clients) {
+        auto client = parseClient(element);
+        if (!client) {
+            return std::nullopt;
+        }
+        status.clients.push_back(std::move(*client));
+    }
+    return status;
+}
+
+Result<ServiceStatus, HostError> askStatus(MessagePorts& ports,
+                                           const std::string& controlPortName) {
+    constexpr std::chrono::seconds kTimeout{5};
+    const auto port = ports.createRemote(controlPortName);
+    if (port == nullptr) {
+        return HostError{"No telephony service is running."};
+    }
+    const auto request = encodeMessage(statusRequest());
+    const auto outcome = port->sendRequest({0, *request, kTimeout, kTimeout, true});
+    const auto message = outcome.reply ? decodeMessage(*outcome.reply) : std::nullopt;
+    const auto status = message ? parseStatusReply(*message) : std::nullopt;
+    if (!status) {
+        return HostError{"The telephony service does not tell its status."};
+    }
+    return *status;
+}
+
+std::string statusText(const ServiceStatus& status) {
+    std::string text = formatText("Technology: %@\nUptime: %lld s\nPackets sent: %lld\n"
+                                  "Packets dropped: %lld\nClients: %zu\n",
+                                  {status.technology, status.uptimeSeconds, status.sent,
+                                   status.dropped, status.clients.size()});
+    for (const ServiceStatus::Client& client : status.clients) {
+        text += formatText("  %@: %@, %lld packets sent, %lld dropped\n",
+                           {client.localPort, client.isStreaming ? "streaming" : "not started",
+                            client.sent, client.dropped});
+    }
+    return text;
+}
+
+} // namespace pallax

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "host/HostError.h"
+#include "platform/PropertyList.h"
+#include "platform/Result.h"
+
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace pallax {
+
+class MessagePorts;
+
+/// What a running service says of itself:
+///
+///   to the control port    {"GetStatus": "GetStatus"}
+///   its answer             {"Technology": text, "Uptime": seconds, "Sent": packets,
+///                           "Dropped": packets, "Clients": [{"LocalPort": name,
+///                           "Streaming": boolean, "Sent": packets, "Dropped": packets}]}
+struct ServiceStatus {
+    struct Client {
+        std::string localPort;
+        bool isStreaming = false; ///< it has sent its start command
+        std::int64_t sent = 0;
+        std::int64_t dropped = 0;
+        friend bool operator==(const Client&, const Client&) = default;
+    };
+    std::string technology;
+    std::int64_t uptimeSeconds = 0;
+    std::int64_t sent = 0;    ///< to all clients, those included that have gone
+    std::int64_t dropped = 0; ///< likewise
+    std::vector<Client> clients;
+    friend bool operator==(const ServiceStatus&, const ServiceStatus&) = default;
+};
+
+Dictionary statusRequest();
+bool isStatusRequest(const Dictionary& message);
+Dictionary statusReply(const ServiceStatus& status);
+/// Nothing when the reply lacks any of it.
+std::optional<ServiceStatus> parseStatusReply(const Dictionary& reply);
+
+/// Asks the service behind that control port; the sentence that tells why not.
+Result<ServiceStatus, HostError> askStatus(MessagePorts& ports, const std::string& controlPortName);
+/// As lines for the user.
+std::string statusText(const ServiceStatus& status);
+
+} // namespace pallax

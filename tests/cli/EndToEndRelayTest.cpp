@@ -1,0 +1,151 @@
+#include "host/Descriptor.h"
+#include "host/Recording.h"
+#include "tests/cli/EndToEnd.h"
+
+#include <algorithm>
+#include <csignal>
+#include <fcntl.h>
+#include <fstream>
+#include <optional>
+#include <sys/stat.h>
+
+namespace pallax {
+namespace {
+
+using doubles::eventually;
+using doubles::PallaxProcess;
+using std::chrono::milliseconds;
+using std::chrono::seconds;
+
+/// `pallax service --relay -`, fed through a named pipe by the test, the recording program.
+class EndToEndRelay : public EndToEnd {
+protected:
+    EndToEndRelay() {
+        EXPECT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+        const Descriptor both(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // so that nobody waits
+        service.emplace(world, std::vector<std::string>{"service", "--relay", "-"}, pipe);
+        auto writer = RecordingWriter::create(pipe, kGsmLinkType);
+        EXPECT_TRUE(writer);
+        device = std::move(writer).value();
+        EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
+    }
+
+    void send(seconds sinceStart, unsigned state) const {
+        EXPECT_EQ(device->write(kSampleStart + sinceStart, registration(state)), std::nullopt);
+    }
+    void sendBytes(const std::string& bytes) const {
+        std::ofstream(pipe, std::ios::binary) << bytes;
+    }
+    /// Waits until so many clients have started their stream.
+    bool clientsStream(int count) const {
+        return eventually([&] {
+            const std::string status = run({"service", "--status"}).out;
+            int streaming = 0;
+            for (auto at = status.find(": streaming"); at != std::string::npos;
+                 at = status.find(": streaming", at + 1)) {
+                ++streaming;
+            }
+            return streaming == count;
+        });
+    }
+    int packetsIn(const std::string& path) const {
+        const auto recording = Recording::open(path);
+        int count = 0;
+        while (recording && (*recording)->next()) {
+            ++count;
+        }
+        return count;
+    }
+
+    std::string pipe = world.path("device");
+    std::unique_ptr<RecordingWriter> device;
+    std::optional<PallaxProcess> service;
+};
+
+TEST_F(EndToEndRelay, AStreamGoesToEveryClientAsItComesAndTheServiceEndsWithIt) {
+    PallaxProcess viewer(world, {"--log-level", "3"});
+    PallaxProcess recorder(world, {"record", world.path("a.pcapng")});
+    ASSERT_TRUE(clientsStream(2));
+    send(seconds(0), 2);
+    send(seconds(3), 2);
+    EXPECT_TRUE(viewer.says("  MM Service State: REG_STATE_REGISTERING\n"));
+    send(seconds(4), 0);
+    device.reset();
+    EXPECT_EQ(service->wait(), 0);
+    EXPECT_EQ(service->err(), "pallax: The stream has ended. 3 packets were relayed.\n");
+    EXPECT_EQ(recorder.wait(), 0);
+    EXPECT_EQ(packetsIn(world.path("a.pcapng")), 3);
+    EXPECT_TRUE(viewer.says("* MM Service State: REG_STATE_INACTIVE\n")) << "the last tick";
+    EXPECT_TRUE(viewer.says("INVALIDATED"));
+    viewer.signal(SIGTERM);
+    EXPECT_EQ(viewer.wait(), 0);
+    EXPECT_TRUE(eventually([this] { return world.sockets().empty(); }));
+}
+
+TEST_F(EndToEndRelay, WhoComesLaterGetsWhatComesLater) {
+    send(seconds(0), 0);
+    send(seconds(1), 0);
+    PallaxProcess recorder(world, {"record", world.path("a.pcapng")});
+    ASSERT_TRUE(clientsStream(1));
+    send(seconds(2), 0);
+    device.reset();
+    EXPECT_EQ(recorder.wait(), 0);
+    EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
+    EXPECT_EQ(service->wait(), 0);
+}
+
+TEST_F(EndToEndRelay, AStreamThatBreaksOffInAPacketIsAFailure) {
+    PallaxProcess recorder(world, {"record", world.path("a.pcapng")});
+    ASSERT_TRUE(clientsStream(1));
+    send(seconds(0), 0);
+    sendBytes(std::string(20, '\0').replace(8, 1, "\x40").replace(12, 1, "\x40"));
+    device.reset();
+    EXPECT_EQ(service->wait(), 1);
+    EXPECT_EQ(service->err(), "pallax: standard input ends in the middle of a packet. 1 packets "
+                              "were relayed.\n");
+    EXPECT_EQ(recorder.wait(), 0) << "its channel was closed in order";
+    EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
+}
+
+TEST_F(EndToEndRelay, AStreamThatTurnsToGarbageIsAFailure) {
+    PallaxProcess recorder(world, {"record", world.path("a.pcapng")});
+    ASSERT_TRUE(clientsStream(1));
+    send(seconds(0), 0);
+    sendBytes(std::string(4096, '\xEE'));
+    EXPECT_EQ(service->wait(), 1) << "without the writer's end";
+    const std::string complaint = service->err();
+    EXPECT_TRUE(complaint.starts_with("pallax: standard input cannot be read on: ")) << complaint;
+    EXPECT_TRUE(complaint.ends_with(". 1 packets were relayed.\n")) << complaint;
+    EXPECT_EQ(recorder.wait(), 0);
+    EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
+}
+
+TEST_F(EndToEndRelay, TheStatusTellsWhatRuns) {
+    const Run idle = run({"service", "--status"});
+    EXPECT_EQ(idle.status, 0);
+    EXPECT_TRUE(idle.out.starts_with("Technology: Zorell_GSM\nUptime: ")) << idle.out;
+    EXPECT_TRUE(idle.out.ends_with(" s\nPackets sent: 0\nPackets dropped: 0\nClients: 0\n"))
+        << idle.out;
+    PallaxProcess viewer(world, {"--print"});
+    ASSERT_TRUE(clientsStream(1));
+    send(seconds(0), 0);
+    send(seconds(1), 2);
+    std::string status;
+    EXPECT_TRUE(eventually([&] {
+        status = run({"service", "--status"}).out;
+        return status.find("Packets sent: 2\n") != std::string::npos;
+    }));
+    EXPECT_TRUE(status.ends_with("Packets sent: 2\nPackets dropped: 0\nClients: 1\n"
+                                 "  com.norvane.BasebandStateReport.LogChannel: streaming, "
+                                 "2 packets sent, 0 dropped\n"))
+        << status;
+    service->signal(SIGTERM);
+    EXPECT_EQ(service->wait(), 0);
+    const Run none = run({"service", "--status"});
+    EXPECT_EQ(none.status, 1);
+    EXPECT_EQ(none.out, "");
+    EXPECT_EQ(none.err, "pallax: No telephony service is running.\n");
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,167 @@
+#include "host/PcapNgWriter.h"
+
+#include "host/Recording.h"
+#include "tests/doubles/RuntimeFolder.h"
+
+#include <gtest/gtest.h>
+#include <rapidcheck.h>
+
+#include <algorithm>
+#include <csignal>
+#include <filesystem>
+#include <sys/resource.h>
+
+namespace pallax {
+namespace {
+
+using Existing = PcapNgWriter::Existing;
+
+constexpr int kZorellLte = 150;
+constexpr Time kStamp{std::chrono::nanoseconds(1'700'000'000'123'456'789)};
+
+class PcapNgWriterTest : public testing::Test {
+protected:
+    std::unique_ptr<PcapNgWriter> create(Existing existing = Existing::Keep) const {
+        auto writer = PcapNgWriter::create(path, existing);
+        EXPECT_TRUE(writer) << writer.error().sentence;
+        return writer ? std::move(writer).value() : nullptr;
+    }
+    /// Writes the bytes as an LTE packet.
+    static std::optional<HostError> write(PcapNgWriter& writer, const ByteBuffer& bytes) {
+        const auto interface = writer.interfaceFor(kZorellLte, "Zorell_LTE");
+        return interface ? writer.write(*interface, kStamp, bytes) : interface.error();
+    }
+    /// How many packets the file has, as its reader finds; -1 when it is damaged.
+    int packetsIn() const {
+        const auto recording = Recording::open(path);
+        if (!recording) {
+            return -1;
+        }
+        int count = 0;
+        while ((*recording)->next()) {
+            ++count;
+        }
+        return (*recording)->error() ? -1 : count;
+    }
+
+    doubles::RuntimeFolder folder;
+    std::string path = folder.file("a.pcapng");
+};
+
+TEST_F(PcapNgWriterTest, WritesASectionAnInterfaceWithItsNameAndPackets) {
+    const auto writer = create();
+    ASSERT_EQ(write(*writer, {0xAA, 0xBB, 0xCC}), std::nullopt);
+    using namespace std::string_literals;
+    const std::string expected =
+        // section header: 44 bytes, byte order, version 1.0, length unknown, program, end
+        "\x0A\x0D\x0D\x0A\x2C\0\0\0\x4D\x3C\x2B\x1A\x01\0\0\0\xFF\xFF\xFF\xFF\xFF\xFF\xFF\xFF"
+        "\x04\0\x06\0pallax\0\0\0\0\0\0\x2C\0\0\0"s
+        // interface: 48 bytes, link type 150, at most 262144 bytes, name, nanoseconds, end
+        "\x01\0\0\0\x30\0\0\0\x96\0\0\0\0\0\x04\0\x02\0\x0A\0Zorell_LTE\0\0"
+        "\x09\0\x01\0\x09\0\0\0\0\0\0\0\x30\0\0\0"s
+        // packet: 36 bytes, interface 0, stamp, 3 bytes of 3, padded
+        "\x06\0\0\0\x24\0\0\0\0\0\0\0\xFE\x9C\x97\x17\x15\xCD\x85\x3D\x03\0\0\0\x03\0\0\0"
+        "\xAA\xBB\xCC\0\x24\0\0\0"s;
+    EXPECT_EQ(doubles::contentOf(path), expected);
+    EXPECT_EQ(writer->size(), expected.size());
+    EXPECT_EQ(PcapNgWriter::sizeOfPacket(3), 36U);
+}
+
+TEST_F(PcapNgWriterTest, IsReadBackToTheNanosecondWhileItIsBeingWritten) {
+    const auto writer = create();
+    EXPECT_EQ(packetsIn(), -1) << "no interface, no link type";
+    for (int count = 1; count <= 3; ++count) {
+        ASSERT_EQ(write(*writer, ByteBuffer(static_cast<std::size_t>(count - 1), 7)), std::nullopt);
+        EXPECT_EQ(packetsIn(), count);
+    }
+    const auto recording = Recording::open(path);
+    ASSERT_TRUE(recording);
+    EXPECT_EQ((*recording)->technology()->identifier, "Zorell_LTE");
+    const auto first = (*recording)->next();
+    ASSERT_TRUE(first);
+    EXPECT_EQ(first->time, kStamp);
+    EXPECT_EQ(first->data.size(), 0U);
+    EXPECT_EQ((*recording)->next()->data.size(), 1U);
+}
+
+TEST_F(PcapNgWriterTest, WhateverIsWrittenIsReadBack) {
+    EXPECT_TRUE(rc::check([this](const std::vector<std::vector<std::uint8_t>>& packets) {
+        const auto writer = create(Existing::Overwrite);
+        const auto interface = writer->interfaceFor(kZorellLte, "Zorell_LTE");
+        std::vector<Time> times;
+        for (const auto& packet : packets) {
+            const auto stamp = *rc::gen::inRange<std::int64_t>(0, std::int64_t{1} << 62U);
+            times.emplace_back(std::chrono::nanoseconds(stamp));
+            RC_ASSERT(!writer->write(*interface, times.back(), packet));
+        }
+        RC_ASSERT(writer->size() == std::filesystem::file_size(path));
+        const auto recording = Recording::open(path);
+        for (std::size_t index = 0; index < packets.size(); ++index) {
+            const auto read = (*recording)->next();
+            RC_ASSERT(read.has_value());
+            RC_ASSERT(read->time == times[index]);
+            RC_ASSERT(std::equal(read->data.begin(), read->data.end(), packets[index].begin(),
+                                 packets[index].end()));
+        }
+        RC_ASSERT(!(*recording)->next());
+        RC_ASSERT(!(*recording)->error());
+    }));
+}
+
+TEST_F(PcapNgWriterTest, ATechnologyIsOneInterface) {
+    const auto writer = create();
+    EXPECT_EQ(*writer->interfaceFor(148, "Zorell_GSM"), 0U);
+    EXPECT_EQ(*writer->interfaceFor(kZorellLte, "Zorell_LTE"), 1U);
+    const auto size = writer->size();
+    EXPECT_EQ(*writer->interfaceFor(148, "Zorell_GSM"), 0U);
+    EXPECT_EQ(writer->size(), size);
+}
+
+TEST_F(PcapNgWriterTest, ATimeBefore1970IsWrittenAs1970) {
+    const auto writer = create();
+    const auto interface = writer->interfaceFor(kZorellLte, "Zorell_LTE");
+    ASSERT_EQ(writer->write(*interface, Time(std::chrono::seconds(-5)), {}), std::nullopt);
+    EXPECT_EQ((*Recording::open(path))->next()->time, Time());
+}
+
+TEST_F(PcapNgWriterTest, AFileThatExistsIsKeptUnlessToldOtherwise) {
+    folder.write("a.pcapng", "precious");
+    const auto refused = PcapNgWriter::create(path, Existing::Keep);
+    ASSERT_FALSE(refused);
+    EXPECT_EQ(refused.error().sentence, path + " exists already; --overwrite replaces it.");
+    EXPECT_EQ(doubles::contentOf(path), "precious");
+    ASSERT_EQ(write(*create(Existing::Overwrite), {1}), std::nullopt);
+    EXPECT_EQ(packetsIn(), 1);
+}
+
+TEST_F(PcapNgWriterTest, AFileThatCannotBeMadeIsAClearFailure) {
+    const std::string missing = folder.file("missing/a.pcapng");
+    EXPECT_EQ(PcapNgWriter::create(missing, Existing::Keep).error().sentence,
+              "The recording " + missing + " cannot be written: No such file or directory.");
+}
+
+TEST_F(PcapNgWriterTest, AFullDiskIsAClearFailure) {
+    EXPECT_EQ(PcapNgWriter::create("/dev/full", Existing::Overwrite).error().sentence,
+              "The recording /dev/full cannot be written: No space left on device.");
+}
+
+TEST_F(PcapNgWriterTest, WhereAPacketDoesNotFitTheFileEndsWithTheOneBefore) {
+    const auto writer = create();
+    ASSERT_EQ(write(*writer, ByteBuffer(100)), std::nullopt);
+    const auto size = writer->size();
+    rlimit before{};
+    ::getrlimit(RLIMIT_FSIZE, &before);
+    const rlimit small{size + 50, before.rlim_max};
+    const auto handler = std::signal(SIGXFSZ, SIG_IGN);
+    ::setrlimit(RLIMIT_FSIZE, &small);
+    const auto error = write(*writer, ByteBuffer(100));
+    ::setrlimit(RLIMIT_FSIZE, &before);
+    (void)std::signal(SIGXFSZ, handler);
+    ASSERT_TRUE(error);
+    EXPECT_EQ(error->sentence, "The recording " + path + " cannot be written: File too large.");
+    EXPECT_EQ(doubles::contentOf(path).size(), size);
+    EXPECT_EQ(packetsIn(), 1);
+}
+
+} // namespace
+} // namespace pallax
