@@ -10,6 +10,7 @@
 #include "LogGenerator/C2K/OneXTrafficErrors.h"
 #include "LogGenerator/C2K/ReverseDataRate.h"
 #include "bench/MeasureRecord.h"
+#include "tests/doubles/C2KLookupNames.h"
 #include "tests/doubles/SubpacketBuilder.h"
 
 #include <initializer_list>
@@ -23,50 +24,24 @@ using doubles::Subpacket;
 Dictionary lookupTable() {
     Dictionary lookup;
     const auto display = std::make_shared<Dictionary>();
-    for (const char* name : {"kChannel",
-                             "kBandClass",
-                             "kSystemId",
-                             "kNetworkId",
-                             "kBaseId",
-                             "kPacketZoneId",
-                             "kProtocolRevision",
-                             "kServingPNOffset",
-                             "k1xDeviceState",
-                             "k1xEVDODeviceState",
-                             "k1xRoamingHome",
-                             "k1xRx0BandClass",
-                             "k1xRx0ChanNum",
-                             "k1xRx1BandClass",
-                             "k1xRx1ChanNum",
-                             "k1xRxAGC0",
-                             "k1xRxAGC1",
-                             "k1xTxAGC",
-                             "k1xTrafficFER",
-                             "k1xActiveSetInfo",
-                             "kRxAGC0",
-                             "kRxAGC1",
-                             "kTxAGC",
-                             "kFLDataRate",
-                             "kRLDataRate",
-                             "kActiveSetPilots",
-                             "kFingerC2I",
-                             "kColorCode",
-                             "kSessionState",
-                             "kUATI24"}) {
+    for (const std::string& name : doubles::kLookupNames) {
         addLookupPlace(name, name, display, lookup);
     }
     return lookup;
 }
 
-/// What one packet costs a parser; its running values go on from packet to packet. The sequence
-/// numbers of the data rates stand still, so that these show nothing.
-template <auto parse, Record (*makePacket)()>
+/// What one packet costs a parser; its running values go on from packet to packet. With a place of
+/// the sequence number's lowest byte, that counts up, so that a data rate is shown each time.
+template <auto parse, Record (*makePacket)(), std::size_t sequenceAt = 0>
 void measureParser(benchmark::State& state) {
     const Dictionary lookup = lookupTable();
     Dictionary running{{"ExtraInfo", Dictionary()}};
-    const ByteBuffer bytes = makePacket().bytes();
+    ByteBuffer bytes = makePacket().bytes();
     const LogRecord packet{Bytes(bytes)};
     for ([[maybe_unused]] const auto iteration : state) {
+        if constexpr (sequenceAt != 0) {
+            ++bytes[sequenceAt];
+        }
         parse(packet, running, lookup);
         benchmark::ClobberMemory();
     }
@@ -78,18 +53,31 @@ Record connectedStatus() {
     return Record(0x1183).padTo(50).at(36, 5);
 }
 
+/// A list of entries from byte `start` on whose bytes are all 1, so that no energy is 0.
+Record sixEntries(LogCode code, std::size_t countAt, std::size_t start, std::size_t entrySize) {
+    Record record(code);
+    record.padTo(start + 6 * entrySize).at(countAt, 6);
+    for (std::size_t offset = start; offset < start + 6 * entrySize; ++offset) {
+        record.at(offset, 1);
+    }
+    return record;
+}
+
 Record sixPilots() {
-    return Record(0x12B6).padTo(25 + 6 * 12).at(15, 6);
+    return sixEntries(0x12B6, 15, 25, 12);
 }
 
 Record sixFingers() {
-    return Record(0x108A).padTo(23 + 6 * 14).at(22, 6);
+    return sixEntries(0x108A, 22, 23, 14);
 }
 
 /// In traffic with three pilots.
 Record trafficStatus() {
-    return packetOf(0x119C, {Subpacket(1).u8(8), Subpacket(2).padTo(14),
-                             Subpacket(3).u16(64).u8(1).u8(2).u8(3).u8(1).padTo(72), Subpacket(4)});
+    Subpacket pilots = Subpacket(3).u16(64).u8(1).u8(2).u8(3).u8(1).padTo(72);
+    for (const std::size_t energy : {28, 48, 68}) {
+        pilots.putU16(energy, 900);
+    }
+    return packetOf(0x119C, {Subpacket(1).u8(8), Subpacket(2).padTo(14), pilots, Subpacket(4)});
 }
 
 Record trafficFrame() {
@@ -103,11 +91,11 @@ Record identity() {
 // One line for each parser.
 BENCHMARK_TEMPLATE(measureParser, parseFingerC2I, sixFingers);
 BENCHMARK_TEMPLATE(measureParser, parseEVDOStatus, connectedStatus);
-BENCHMARK_TEMPLATE(measureParser, parseForwardDataRate, zeros<0x1192, 241>);
+BENCHMARK_TEMPLATE(measureParser, parseForwardDataRate, zeros<0x1192, 241>, 13);
 BENCHMARK_TEMPLATE(measureParser, parseEVDOActiveSet, sixPilots);
 BENCHMARK_TEMPLATE(measureParser, parseOneXStatus, trafficStatus);
 BENCHMARK_TEMPLATE(measureParser, parseOneXTrafficErrors, trafficFrame);
-BENCHMARK_TEMPLATE(measureParser, parseReverseDataRate, zeros<0x127E, 1750>);
+BENCHMARK_TEMPLATE(measureParser, parseReverseDataRate, zeros<0x127E, 1750>, 14);
 BENCHMARK_TEMPLATE(measureParser, parseOneXSystemIdentity, identity);
 
 } // namespace

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/C2K/C2KLogGenerator.h"
 #include "app/tree/PallaxModelNode.h"
+#include "tests/doubles/C2KLookupNames.h"
 #include "tests/doubles/GeneratorFixture.h"
 #include "tests/doubles/RecordProperties.h"
 
@@ -12,40 +13,6 @@
 #include <vector>
 
 namespace pallax::doubles {
-
-/// Every name that some parser fills.
-inline const std::vector<std::string> kLookupNames = {
-    "kChannel",
-    "kBandClass",
-    "kSystemId",
-    "kNetworkId",
-    "kBaseId",
-    "kPacketZoneId",
-    "kProtocolRevision",
-    "kServingPNOffset",
-    "k1xDeviceState",
-    "k1xEVDODeviceState",
-    "k1xRoamingHome",
-    "k1xRx0BandClass",
-    "k1xRx0ChanNum",
-    "k1xRx1BandClass",
-    "k1xRx1ChanNum",
-    "k1xRxAGC0",
-    "k1xRxAGC1",
-    "k1xTxAGC",
-    "k1xTrafficFER",
-    "k1xActiveSetInfo",
-    "kRxAGC0",
-    "kRxAGC1",
-    "kTxAGC",
-    "kFLDataRate",
-    "kRLDataRate",
-    "kActiveSetPilots",
-    "kFingerC2I",
-    "kColorCode",
-    "kSessionState",
-    "kUATI24",
-};
 
 /// A template with one row for each lookup name, called like it.
 inline PropertyList flatTemplate() {
