@@ -7,6 +7,11 @@ target_compile_options(pallax_options INTERFACE
     -Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror
 )
 target_include_directories(pallax_options INTERFACE ${PROJECT_SOURCE_DIR})
+# What a user runs reads bytes of strangers: a fault that got through is to end the program.
+target_compile_options(pallax_options INTERFACE
+    "$<$<CONFIG:Release>:-fstack-protector-strong;-U_FORTIFY_SOURCE;-D_FORTIFY_SOURCE=2;-fPIE>"
+)
+target_link_options(pallax_options INTERFACE "$<$<CONFIG:Release>:-pie;-Wl,-z,relro,-z,now>")
 if(PALLAX_SANITIZE)
     # -Wno-maybe-uninitialized: the sanitizers' instrumentation makes g++ 12 see ghosts.
     target_compile_options(pallax_options INTERFACE
