@@ -83,14 +83,21 @@ TEST_F(EndToEndRelay, AStreamGoesToEveryClientAsItComesAndTheServiceEndsWithIt) 
 }
 
 TEST_F(EndToEndRelay, WhoComesLaterGetsWhatComesLater) {
+    const std::string early = world.path("early.pcapng");
+    const std::string late = world.path("late.pcapng");
+    PallaxProcess first(world, {"record", early});
+    ASSERT_TRUE(clientsStream(1));
     send(seconds(0), 0);
     send(seconds(1), 0);
-    PallaxProcess recorder(world, {"record", world.path("a.pcapng")});
-    ASSERT_TRUE(clientsStream(1));
+    ASSERT_TRUE(eventually([&] { return packetsIn(early) == 2; }));
+    PallaxProcess second(world, {"record", late});
+    ASSERT_TRUE(clientsStream(2));
     send(seconds(2), 0);
     device.reset();
-    EXPECT_EQ(recorder.wait(), 0);
-    EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
+    EXPECT_EQ(first.wait(), 0);
+    EXPECT_EQ(second.wait(), 0);
+    EXPECT_EQ(packetsIn(early), 3);
+    EXPECT_EQ(packetsIn(late), 1);
     EXPECT_EQ(service->wait(), 0);
 }
 
