@@ -83,15 +83,45 @@ TEST_F(EndToEndRelay, AStreamGoesToEveryClientAsItComesAndTheServiceEndsWithIt) 
 }
 
 TEST_F(EndToEndRelay, WhoComesLaterGetsWhatComesLater) {
+    const std::string early = world.path("early.pcapng");
+    const std::string late = world.path("late.pcapng");
+    PallaxProcess first(world, {"record", early});
+    ASSERT_TRUE(clientsStream(1));
     send(seconds(0), 0);
     send(seconds(1), 0);
-    PallaxProcess recorder(world, {"record", world.path("a.pcapng")});
-    ASSERT_TRUE(clientsStream(1));
+    ASSERT_TRUE(eventually([&] { return packetsIn(early) == 2; }));
+    PallaxProcess second(world, {"record", late});
+    ASSERT_TRUE(clientsStream(2));
     send(seconds(2), 0);
     device.reset();
-    EXPECT_EQ(recorder.wait(), 0);
-    EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
+    EXPECT_EQ(first.wait(), 0);
+    EXPECT_EQ(second.wait(), 0);
+    EXPECT_EQ(packetsIn(early), 3);
+    EXPECT_EQ(packetsIn(late), 1);
     EXPECT_EQ(service->wait(), 0);
+}
+
+TEST_F(EndToEndRelay, AClientThatTakesNothingKeepsNobodyWaitingNotEvenTheEnd) {
+    constexpr int kPackets = 40'000; // of 50 bytes and more on the wire: above what may wait
+    const std::string file = world.path("living.pcapng");
+    PallaxProcess stopped(world, {"record", world.path("stopped.pcapng")});
+    PallaxProcess living(world, {"record", file});
+    ASSERT_TRUE(clientsStream(2));
+    stopped.signal(SIGSTOP);
+    for (int count = 0; count < kPackets; ++count) {
+        send(seconds(count), 0);
+    }
+    device.reset();
+    EXPECT_EQ(service->wait(), 0);
+    EXPECT_NE(service->err().find(" is too slow: packets are dropped.\n"), std::string::npos);
+    EXPECT_NE(service->err().find("The stream has ended. 40000 packets were relayed.\n"),
+              std::string::npos)
+        << service->err();
+    EXPECT_EQ(living.wait(), 0);
+    stopped.signal(SIGCONT);
+    stopped.signal(SIGTERM);
+    EXPECT_EQ(stopped.wait(), 0);
+    EXPECT_GT(packetsIn(file), packetsIn(world.path("stopped.pcapng")));
 }
 
 TEST_F(EndToEndRelay, AStreamThatBreaksOffInAPacketIsAFailure) {
