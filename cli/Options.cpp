@@ -1,5 +1,7 @@
 #include "cli/Options.h"
 
+#include "cli/OptionParts.h"
+
 #include <CLI/CLI.hpp>
 
 #include <algorithm>
@@ -15,6 +17,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax                               browse the live modem
   pallax drive.pcap --speed 4          browse a recording, four times as fast
   modem-dump | pallax -                browse what another program records
+  pallax demo                          browse a simulated modem
   pallax decode drive.pcap             its last display as JSON
   pallax decode --every tick --format csv drive.pcap > drive.csv
   pallax service --play drive.pcap     let viewers connect to a played recording
@@ -33,52 +36,17 @@ Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is s
 
 constexpr const char* kServiceFooter = R"(Examples:
   pallax service --play drive.pcap
-  pallax service --play drive.pcap --speed max --loop)";
+  pallax service --play drive.pcap --speed max --loop
+  pallax service --simulate lte --seed 7)";
 
 void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
-    const auto takeSpeed = [&play](const std::string& text) {
-        const auto speed = parseSpeed(text);
-        if (!speed) {
-            throw CLI::ValidationError("--speed",
-                                       "\"" + text + "\" is neither a number above 0 nor max");
-        }
-        play.speed = *speed;
-    };
-    app.add_option_function<std::string>("--speed", takeSpeed,
-                                         "Play that many times as fast; max: as fast as possible")
-        ->type_name("X|max")
-        ->needs(recording);
+    addSpeed(app, play)->needs(recording);
     app.add_flag("--loop", play.loop, "Begin again at the recording's end")->needs(recording);
 }
 
-/// Every choice goes by its name in the map, in the help and in the message about a wrong one.
-template <class Value>
-void addChoice(CLI::App& app, const std::string& name, Value& value,
-               const std::vector<std::pair<std::string, Value>>& choices,
-               const std::string& description) {
-    std::string names;
-    for (const auto& choice : choices) {
-        names += (names.empty() ? "" : "|") + choice.first;
-    }
-    const auto take = [name, &value, choices, names](const std::string& text) {
-        const auto found = std::find_if(choices.begin(), choices.end(),
-                                        [&](const auto& choice) { return choice.first == text; });
-        if (found == choices.end()) {
-            throw CLI::ValidationError(name, "\"" + text + "\" is none of " + names);
-        }
-        value = found->second;
-    };
-    app.add_option_function<std::string>(name, take, description)->type_name(names);
-}
-
-void addBrowse(CLI::App& app, BrowseOptions& options) {
+/// What is common to all ways of browsing.
+void addView(CLI::App& app, BrowseOptions& options) {
     constexpr int kHighestLevel = 7;
-    CLI::Option* recording =
-        app.add_option(
-               "RECORDING", options.recording,
-               "A recording (pcap or pcapng; - is standard input) to browse as it is played; "
-               "without one, the live modem")
-            ->type_name("");
     app.add_flag("--print", options.print,
                  "Print the tree as text at each display tick, as is done without a terminal");
     addChoice<terminal::ColorUse>(app, "--color", options.color,
@@ -89,13 +57,23 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
     app.add_flag_callback(
         "--no-mouse", [&options] { options.mouse = false; },
         "Leave the mouse to the terminal, so that text can be selected");
-    addPlay(app, options.play, recording);
     app.add_flag("--keep-going", options.keepGoing,
                  "Drop a record that cannot be read instead of ending with status 70");
     app.add_option("--log-level", options.logLevel,
                    "Write system-log lines up to this priority to standard error")
         ->check(CLI::Range(0, kHighestLevel).name("").description(""))
         ->type_name("0-7");
+}
+
+void addBrowse(CLI::App& app, BrowseOptions& options) {
+    CLI::Option* recording =
+        app.add_option(
+               "RECORDING", options.recording,
+               "A recording (pcap or pcapng; - is standard input) to browse as it is played; "
+               "without one, the live modem")
+            ->type_name("");
+    addView(app, options);
+    addPlay(app, options.play, recording);
 }
 
 void addDecode(CLI::App& app, DecodeOptions& options) {
@@ -125,8 +103,9 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
 void addService(CLI::App& app, ServiceOptions& options) {
     CLI::Option* recording =
         app.add_option("--play", options.recording, "The recording to play to each viewer")
-            ->required()
             ->type_name("RECORDING");
+    CLI::Option* simulated = addServiceSimulation(app, options.simulation);
+    simulated->excludes(recording);
     addPlay(app, options.play, recording);
     app.footer(kServiceFooter);
 }
@@ -184,6 +163,16 @@ ParsedOptions parseOptions(std::vector<std::string> arguments) {
         app.add_subcommand("service", "Run the telephony service that viewers connect to");
     prepare(*serviceApp);
     addService(*serviceApp, service);
+    BrowseOptions demo;
+    CLI::App* demoApp = app.add_subcommand("demo", "Browse a simulated modem");
+    prepare(*demoApp);
+    addDemo(*demoApp, demo.simulation.emplace(), demo.play);
+    addView(*demoApp, demo);
+    SimulateOptions simulate;
+    CLI::App* simulateApp =
+        app.add_subcommand("simulate", "Write a simulated modem's packets as a recording");
+    prepare(*simulateApp);
+    addSimulate(*simulateApp, simulate);
 
     const std::string first = arguments.empty() ? "" : arguments.front();
     std::reverse(arguments.begin(), arguments.end()); // as CLI11 takes them
@@ -206,7 +195,16 @@ ParsedOptions parseOptions(std::vector<std::string> arguments) {
         return decode;
     }
     if (serviceApp->parsed()) {
+        if (service.recording.empty() && !service.simulation) {
+            return wrongUsage("service: --play or --simulate is required");
+        }
         return service;
+    }
+    if (demoApp->parsed()) {
+        return demo;
+    }
+    if (simulateApp->parsed()) {
+        return simulate;
     }
     return browse;
 }

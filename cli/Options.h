@@ -2,6 +2,7 @@
 
 #include "cli/DecodeCommand.h"
 #include "cli/ExitStatus.h"
+#include "cli/SimulateOptions.h"
 #include "telephony/Service.h"
 #include "ui/terminal/CursesTerminal.h"
 
@@ -13,7 +14,8 @@
 namespace pallax {
 
 struct BrowseOptions {
-    std::optional<std::string> recording; ///< without one, the live modem
+    std::optional<std::string> recording;        ///< without one, the live modem
+    std::optional<SimulationOptions> simulation; ///< or a simulated modem
     PlayOptions play;
     bool print = false;
     terminal::ColorUse color = terminal::ColorUse::Auto;
@@ -28,7 +30,8 @@ struct ParseEnd {
     std::string text;  ///< with its line end
 };
 
-using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, ServiceOptions, ParseEnd>;
+using ParsedOptions =
+    std::variant<BrowseOptions, DecodeOptions, ServiceOptions, SimulateOptions, ParseEnd>;
 
 /// `arguments` are those after the program's name.
 ParsedOptions parseOptions(std::vector<std::string> arguments);

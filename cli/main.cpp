@@ -2,6 +2,7 @@
 #include "cli/Output.h"
 #include "cli/Programs.h"
 #include "telephony/ChildService.h"
+#include "telephony/simulator/SimulatedRecording.h"
 
 #include <csignal>
 #include <cstdio>
@@ -19,6 +20,13 @@ struct Run {
     ExitStatus operator()(const DecodeOptions& options) const { return runDecode(options); }
     ExitStatus operator()(const ServiceOptions& options) const {
         return runService(options) == 0 ? kExitSuccess : kExitFailure;
+    }
+    ExitStatus operator()(const SimulateOptions& options) const {
+        if (const auto error = writeSimulatedRecording(options.simulation, options.file)) {
+            complain(error->sentence);
+            return kExitFailure;
+        }
+        return kExitSuccess;
     }
     ExitStatus operator()(const ParseEnd& end) const {
         const bool wanted = end.status == kExitSuccess;

@@ -5,6 +5,7 @@
 #include "telephony/RecordingSource.h"
 #include "telephony/StreamSource.h"
 #include "telephony/TelephonyServer.h"
+#include "telephony/simulator/SimulatedSource.h"
 
 #include <array>
 #include <charconv>
@@ -24,8 +25,16 @@ void complain(const std::string& sentence) {
 }
 
 /// A factory of sources; fails at once for what no channel could play.
-Result<PacketSourceFactory, HostError> sourceFactory(const std::string& path,
+Result<PacketSourceFactory, HostError> sourceFactory(const ServiceOptions& options,
                                                      AsioMainQueue& queue) {
+    if (options.simulation) {
+        return PacketSourceFactory(
+            [simulation =
+                 *options.simulation]() -> Result<std::unique_ptr<PacketSource>, HostError> {
+                return std::unique_ptr<PacketSource>(std::make_unique<SimulatedSource>(simulation));
+            });
+    }
+    const std::string& path = options.recording;
     auto recording = openKnownRecording(path);
     if (!recording) {
         return recording.error();
@@ -48,7 +57,7 @@ int serve(const ServiceOptions& options, const std::function<void()>& ready,
           SocketDirectory directory) {
     AsioMainQueue queue;
     SocketMessagePorts ports(queue, std::move(directory));
-    auto factory = sourceFactory(options.recording, queue);
+    auto factory = sourceFactory(options, queue);
     if (!factory) {
         complain(factory.error().sentence);
         return 1;

@@ -2,6 +2,7 @@
 
 #include "telephony/ControlMessages.h"
 #include "telephony/PacketPlayer.h"
+#include "telephony/simulator/Simulation.h"
 
 #include <functional>
 #include <optional>
@@ -15,6 +16,7 @@ struct ServiceOptions {
     std::string recording; ///< path, "-" for standard input (played once, to the first channel)
     PlayOptions play;
     std::string controlPortName = std::string(kTelephonyControlPort);
+    std::optional<SimulationOptions> simulation = {}; ///< instead of a recording
 };
 
 /// "1.5", "max": how options say a speed.
