@@ -32,6 +32,10 @@ std::vector<SamplePacket> gsmAttachPackets();
 /// behind a hill, neighbours that come and go.
 std::vector<SamplePacket> umtsDrivePackets();
 
+/// A minute of a CDMA phone in a car: idle on 1x, a call over a handover with frames in error, then
+/// a data session over EV-DO.
+std::vector<SamplePacket> cdmaDrivePackets();
+
 /// Two minutes of an LTE phone in a car: idle and connected mode, handovers, neighbours of every
 /// technology.
 std::vector<SamplePacket> lteDrivePackets();

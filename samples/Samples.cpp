@@ -11,6 +11,7 @@ std::span<const Sample> samples() {
     static constexpr auto kSamples = std::to_array<Sample>({
         {"gsm-attach.pcap", "gsm", gsmAttachPackets},
         {"umts-drive.pcap", "gsm", umtsDrivePackets},
+        {"cdma-drive.pcap", "cdma", cdmaDrivePackets},
         {"lte-drive.pcap", "lte", lteDrivePackets},
         {"utran-drive.pcap", "utran", utranDrivePackets},
         {"ifx-stream.pcap", "ifx", ifxStreamPackets},

@@ -238,6 +238,27 @@ TEST_F(SaveViewTest, IntoAMissingDirectoryTheAlertStaysOverTheClosedScreenAndThe
     EXPECT_EQ(disk.files.size(), 1U);
 }
 
+TEST_F(SaveViewTest, OfTheObjectStreamModemItHoldsTheHistoryAndNoDLF) {
+    launchWith(technologies(), "IFX");
+    for (int message = 0; message < 10; ++message) {
+        const std::string sent = "{ Cell = { ARFCN = " + std::to_string(message) + "; }; }";
+        ports.deliver(ByteBuffer(sent.begin(), sent.end()));
+        advance(PallaxModel::kDisplayInterval);
+    }
+    EXPECT_EQ(rowsOf(top()), "Cell=9");
+    save("no raw records");
+    const Array data = savedData();
+    ASSERT_EQ(data.size(), LogGenerator::kHistoryLength);
+    for (std::size_t entry = 0; entry < data.size(); ++entry) {
+        const std::string arfcn = std::to_string(5 + entry);
+        EXPECT_EQ(*data[entry].dictionary()->find("Display"),
+                  PropertyList(Dictionary{{"Cell", arfcn}}));
+        EXPECT_EQ(*data[entry].dictionary()->find("DisplayState"),
+                  PropertyList(Dictionary{{"Cell", Dictionary{{"ARFCN", arfcn}}}}));
+        EXPECT_FALSE(data[entry].dictionary()->contains("DLF"));
+    }
+}
+
 /// A technology with its real generator and template, and a log code that its records read.
 struct RealTechnology {
     const char* identifier;

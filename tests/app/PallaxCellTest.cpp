@@ -92,6 +92,19 @@ TEST_F(PallaxCellTest, KeyAndValueAreRetainedWhenSet) {
     EXPECT_EQ(key.use_count(), 2);
 }
 
+TEST_F(PallaxCellTest, WhatIsDrawnAreItsLabelsInTheirContainer) {
+    const auto leafCell = leaf({{0, 0}, {320, 44}});
+    EXPECT_EQ(leafCell->contents().container, leafCell->view().get());
+    EXPECT_EQ(leafCell->contents().labels,
+              (std::vector<const ui::Label*>{leafCell->key().get(), leafCell->value().get()}));
+    const auto branchCell = branch({{0, 0}, {320, 44}});
+    EXPECT_EQ(branchCell->contents().container, nullptr);
+    EXPECT_EQ(branchCell->contents().labels,
+              (std::vector<const ui::Label*>{branchCell->key().get()}));
+    branchCell->setKey(nullptr);
+    EXPECT_TRUE(branchCell->contents().labels.empty());
+}
+
 TEST_F(PallaxCellTest, BothLayoutsFirstLetTheToolkitLayOutItsOwnLabel) {
     const Rect bounds{{3, 4}, {320, 44}};
     EXPECT_EQ(leaf(bounds)->textLabel().frame, bounds);

@@ -1,0 +1,141 @@
+#include "LogGenerator/C2K/C2KLogGenerator.h"
+
+#include "LogGenerator/C2K/C2KLookup.h"
+#include "LogGenerator/C2K/EVDOActiveSet.h"
+#include "LogGenerator/C2K/EVDOStatus.h"
+#include "LogGenerator/C2K/FingerC2I.h"
+#include "LogGenerator/C2K/ForwardDataRate.h"
+#include "LogGenerator/C2K/OneXStatus.h"
+#include "LogGenerator/C2K/OneXSystemIdentity.h"
+#include "LogGenerator/C2K/OneXTrafficErrors.h"
+#include "LogGenerator/C2K/ReverseDataRate.h"
+#include "LogGenerator/LogPacket.h"
+#include "platform/Resources.h"
+#include "platform/SystemLog.h"
+
+#include <algorithm>
+#include <array>
+
+namespace pallax {
+
+namespace {
+
+/// Turns a packet into values under their lookup names; may keep running values in the state.
+struct Parser {
+    LogCode logCode;
+    void (*parse)(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+};
+
+/// In the order in which the start command names the codes.
+constexpr auto kParsers = std::to_array<Parser>({
+    {0x108A, parseFingerC2I},
+    {0x1183, parseEVDOStatus},
+    {0x1192, parseForwardDataRate},
+    {0x12B6, parseEVDOActiveSet},
+    {0x119C, parseOneXStatus},
+    {0x119D, parseOneXTrafficErrors},
+    {0x127E, parseReverseDataRate},
+    {0x134F, parseOneXSystemIdentity},
+});
+
+constexpr std::string_view kSorted = "_sorted";
+
+/// The dictionary under a key of the state, or null.
+DictionaryRef dictionaryUnder(std::string_view key, const Dictionary& state) {
+    const PropertyList* found = state.find(key);
+    return found != nullptr ? found->dictionary() : nullptr;
+}
+
+} // namespace
+
+std::unique_ptr<LogGenerator> C2KLogGenerator::generator(const GeneratorEnvironment& environment) {
+    return std::make_unique<C2KLogGenerator>(environment);
+}
+
+PropertyList C2KLogGenerator::getStartCommand() const {
+    Array logCodes;
+    for (const Parser& parser : kParsers) {
+        logCodes.push_back(PropertyList::integer(parser.logCode));
+    }
+    return Dictionary{{"SetState", "Streaming"}, {"SetZorellLogCodes", std::move(logCodes)}};
+}
+
+void C2KLogGenerator::processTemplate(const Dictionary& templateDictionary,
+                                      const DictionaryRef& storeDisplayIntoDict,
+                                      Dictionary& storeLookupIntoDict) {
+    for (const Dictionary::Entry& entry : templateDictionary) {
+        if (!entry.hasStringKey) {
+            continue; // could neither be shown nor named as a place
+        }
+        if (const DictionaryRef section = entry.value.dictionary()) {
+            const auto display = std::make_shared<Dictionary>();
+            processTemplate(*section, display, storeLookupIntoDict);
+            storeDisplayIntoDict->set(entry.key, display);
+        } else if (const auto text = entry.value.string()) {
+            if (*text == kSorted) {
+                storeDisplayIntoDict->set(entry.key, Text::fixed(kSorted));
+            } else {
+                storeDisplayIntoDict->set(entry.key, Text::fixed(""));
+                addLookupPlace(*text, entry.key, storeDisplayIntoDict, storeLookupIntoDict);
+            }
+        }
+    }
+    systemLog(LogPriority::Warning, "Processing the template");
+}
+
+PropertyList C2KLogGenerator::getDisplayFromState(Dictionary& state) const {
+    if (const PropertyList* display = state.find("Display")) {
+        return *display;
+    }
+    DictionaryRef templateDictionary = dictionaryUnder("Template", state);
+    if (templateDictionary == nullptr) {
+        const auto loaded = environment().resources.propertyList("C2KTemplate");
+        templateDictionary = loaded ? loaded->dictionary() : nullptr;
+        if (templateDictionary == nullptr) {
+            systemLog(LogPriority::Error, "Cannot load C2K template for display");
+            return {};
+        }
+        state.setFixed("Template", templateDictionary);
+    }
+    const auto display = std::make_shared<Dictionary>();
+    const auto lookup = std::make_shared<Dictionary>();
+    processTemplate(*templateDictionary, display, *lookup);
+    state.setFixed("Display", display);
+    state.setFixed("Lookup", lookup);
+    state.setFixed("ExtraInfo", Dictionary());
+    return display;
+}
+
+void C2KLogGenerator::updateState(Dictionary& state, Bytes data) {
+    (void)getDisplayFromState(state);
+    const DictionaryRef lookup = dictionaryUnder("Lookup", state);
+    updateFromLog(data, lookup != nullptr ? *lookup : Dictionary(), state);
+}
+
+void C2KLogGenerator::updateFromLog(Bytes packet, const Dictionary& lookup, Dictionary& state) {
+    if (packet.size() < LogRecord::kHeaderLength) { // asked of the message, prefix included
+        return;
+    }
+    const LogRecord record(LogPacketStripPrefix(packet));
+    const std::uint8_t type = record.u8(0);
+    if (type != LogRecord::kStandardType) {
+        systemLog(LogPriority::Error, "Invalid log type: %x. Dropping.", type); // it is not
+    }
+    const LogCode code = LogPacketGetLogCode(record);
+    const auto* parser = std::find_if(kParsers.begin(), kParsers.end(),
+                                      [code](const Parser& each) { return each.logCode == code; });
+    if (parser == kParsers.end()) {
+        return;
+    }
+    parser->parse(record, state, lookup);
+    capture(record.bytes());
+}
+
+PropertyList C2KLogGenerator::generateLogUsingState(Dictionary& state) {
+    PropertyList display = getDisplayFromState(state);
+    handOverCapture(state);
+    updateHistoryInState(state, environment().clock);
+    return display;
+}
+
+} // namespace pallax

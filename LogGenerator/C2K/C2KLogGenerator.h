@@ -1,0 +1,41 @@
+#pragma once
+
+#include "LogGenerator/Records/LogCode.h"
+#include "LogGenerator/ZORLogGenerator.h"
+
+#include <memory>
+
+namespace pallax {
+
+/// The generator of the CDMA technology, 1x and EV-DO. It has no records with sections of their
+/// own: the parser of a log code stores each value under a lookup name, and the template
+/// "C2KTemplate" says where that name is shown, in as many places as it likes.
+///
+/// A template is a property list of dictionaries. In any of them a dictionary is a section, the
+/// string "_sorted" stands for itself, any other string is a lookup name, and the rest is ignored.
+///
+/// The state's keys, beside those of every generator: "Lookup" (the lookup table, see C2KLookup.h)
+/// and the running values of the parsers.
+class C2KLogGenerator final : public ZORLogGenerator {
+public:
+    static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment);
+
+    using ZORLogGenerator::ZORLogGenerator;
+
+    void updateState(Dictionary& state, Bytes data) override;
+    PropertyList generateLogUsingState(Dictionary& state) override;
+    PropertyList getStartCommand() const override;
+
+    /// Adds a template's rows to a display and their places to a lookup table.
+    static void processTemplate(const Dictionary& templateDictionary,
+                                const DictionaryRef& storeDisplayIntoDict,
+                                Dictionary& storeLookupIntoDict);
+    /// The display, made on first use; null while the template cannot be loaded.
+    PropertyList getDisplayFromState(Dictionary& state) const;
+    /// Framing and dispatch of one packet. A packet of a known code is captured behind its prefix,
+    /// whether or not its parser accepts it; nothing else is captured. A wrong log type is
+    /// reported, but does not stop the packet.
+    void updateFromLog(Bytes packet, const Dictionary& lookup, Dictionary& state);
+};
+
+} // namespace pallax

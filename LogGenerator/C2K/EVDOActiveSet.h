@@ -1,0 +1,20 @@
+#pragma once
+
+#include "LogGenerator/Records/LogRecord.h"
+#include "platform/PropertyList.h"
+
+namespace pallax {
+
+/// The pilots of the EV-DO active set and their energies.
+///
+///   0x12B6, at least 25 bytes and room for every pilot, little-endian
+///   byte  width  lookup name        shown as
+///   15    8                         number of pilots
+///   25           kActiveSetPilots   list by pilot, or "(none)"
+///
+///   a pilot, 12 bytes
+///   0     16     PN offset
+///   2     16     energy: 10 x log10(raw / 512), dB
+void parseEVDOActiveSet(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+} // namespace pallax

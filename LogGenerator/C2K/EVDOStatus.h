@@ -1,0 +1,24 @@
+#pragma once
+
+#include "LogGenerator/Records/LogRecord.h"
+#include "platform/PropertyList.h"
+
+namespace pallax {
+
+/// The state of the EV-DO protocol, its carrier and its levels.
+///
+///   0x1183, exactly 50 bytes, little-endian
+///   byte  bit  width  lookup name          shown as
+///   13    0    11     kChannel             number
+///   14    3    5      kBandClass           band class label
+///   15    0    8      kRxAGC0              signed, dBm
+///   16    0    8      kRxAGC1              signed, dBm; "N/A" unless the device state is 4 or more
+///   17    0    8      kTxAGC               signed, dBm; "N/A" unless the device state is 4 or more
+///   18    0    16     kServingPNOffset     number x 64 chips; 0xFFFF "Invalid Value"
+///   36    0    8      k1xEVDODeviceState   EV-DO device state label
+///   37    0    8      kSessionState        EV-DO session state label
+///   38    0    24     kUATI24              0x and six hexadecimal digits
+///   41    0    8      kColorCode           number
+void parseEVDOStatus(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+} // namespace pallax

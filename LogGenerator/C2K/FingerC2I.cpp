@@ -1,0 +1,51 @@
+#include "LogGenerator/C2K/FingerC2I.h"
+
+#include "LogGenerator/C2K/C2KFormats.h"
+#include "LogGenerator/C2K/C2KLookup.h"
+#include "LogGenerator/C2K/PilotList.h"
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr std::size_t kFingerCount = 22;
+constexpr std::size_t kFingers = 23;
+constexpr std::size_t kFingerLength = 14;
+
+// From a finger's start.
+constexpr std::size_t kPN = 0;
+constexpr std::size_t kCarrierToInterference = 6;
+
+constexpr std::uint16_t kUnlocked = 0xFFFF;
+
+} // namespace
+
+void parseFingerC2I(const LogRecord& packet, Dictionary& /*state*/, const Dictionary& lookup) {
+    if (!packet.has(kFingers)) {
+        systemLog(LogPriority::Error,
+                  "Log code 0x108a is %u bytes long but must be at least %lu bytes.",
+                  packet.length(), kFingers);
+        return;
+    }
+    const std::size_t count = packet.u8(kFingerCount);
+    if (packet.length() != kFingers + count * kFingerLength) {
+        systemLog(LogPriority::Error,
+                  "Log code 0x108a has bad length of %u bytes, but has %d substructs (size=%lu).",
+                  packet.length(), count, kFingers);
+        return;
+    }
+    PilotList fingers;
+    for (std::size_t index = 0; index < count; ++index) {
+        const LogRecord finger = packet.from(kFingers + index * kFingerLength);
+        const std::uint16_t pn = finger.u16(kPN);
+        if (pn != kUnlocked) {
+            fingers.add(
+                index, pn,
+                DisplayNumber(energyInDb(finger.u16(kCarrierToInterference)), kSignedLevelDb));
+        }
+    }
+    setLookupValue("kFingerC2I", fingers.listOrNone(), lookup);
+}
+
+} // namespace pallax

@@ -1,0 +1,62 @@
+#include "LogGenerator/C2K/OneXSystemIdentity.h"
+
+#include "LogGenerator/C2K/C2KFormats.h"
+#include "LogGenerator/C2K/C2KLabels.h"
+#include "LogGenerator/C2K/C2KLookup.h"
+#include "platform/SystemLog.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr std::size_t kMinimumLength = 171;
+constexpr std::uint8_t kLeastVersion = 2;
+
+constexpr std::size_t kVersion = 13;
+constexpr std::size_t kRoamingIndicator = 42;
+constexpr std::size_t kSystemType = 46;
+constexpr Position kSystemId = u16At(50);
+constexpr Position kNetworkId = u16At(52);
+constexpr Position kPacketZoneId = u8At(131);
+constexpr Position kProtocolRevision = u8At(133);
+constexpr Position kBaseId = u16At(184);
+
+/// The system type whose identity the packet carries.
+constexpr std::uint32_t kKnownSystemType = 2;
+
+} // namespace
+
+void parseOneXSystemIdentity(const LogRecord& packet, Dictionary& /*state*/,
+                             const Dictionary& lookup) {
+    if (!packet.has(kMinimumLength)) {
+        systemLog(LogPriority::Error,
+                  "Log code 0x134f is %d bytes long but must be at least %lu bytes.",
+                  packet.length(), kMinimumLength);
+        return;
+    }
+    if (const std::uint8_t version = packet.u8(kVersion); version < kLeastVersion) {
+        systemLog(LogPriority::Error,
+                  "Log code 0x134f has version=%d; only version 2 or higher expected; dropping.",
+                  version);
+        return;
+    }
+    const std::uint32_t systemType = packet.u32(kSystemType);
+    const auto number = [&packet](const Position& position) -> PropertyList {
+        return DisplayNumber(packet.read(position), kDecimal);
+    };
+    const auto ofKnownSystem = [&](const Position& position) -> PropertyList {
+        // A text, for the number in it is not that of the row.
+        return systemType == kKnownSystemType
+                   ? number(position)
+                   : formatText("(unknown system type %d)", {systemType});
+    };
+    setLookupValue("k1xRoamingHome", kRoamingIndicators.valueOf(packet.u32(kRoamingIndicator)),
+                   lookup);
+    setLookupValue("kSystemId", ofKnownSystem(kSystemId), lookup);
+    setLookupValue("kNetworkId", ofKnownSystem(kNetworkId), lookup);
+    setLookupValue("kPacketZoneId", number(kPacketZoneId), lookup);
+    setLookupValue("kBaseId", number(kBaseId), lookup);
+    setLookupValue("kProtocolRevision", number(kProtocolRevision), lookup);
+}
+
+} // namespace pallax

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "LogGenerator/Records/LogRecord.h"
+#include "platform/PropertyList.h"
+
+namespace pallax {
+
+/// Whether a frame of the 1x traffic channel was in error; the rate of such frames is averaged.
+///
+///   0x119D, at least 17 bytes, made of subpackets
+///   byte  width  lookup name     shown as
+///   11: traffic demodulation
+///   24    8      k1xTrafficFER   an error unless 0: the average, in per cent
+void parseOneXTrafficErrors(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+} // namespace pallax

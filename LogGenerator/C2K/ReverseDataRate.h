@@ -1,0 +1,23 @@
+#pragma once
+
+#include "LogGenerator/Records/LogRecord.h"
+#include "platform/PropertyList.h"
+
+namespace pallax {
+
+/// How much the EV-DO reverse link has carried: counters by rate, each rate with a weight of its
+/// own. Shown as a rate; see DataRate.h.
+///
+///   0x127E, at least 1750 bytes, little-endian; the sequence number stands one byte later than
+///   in the packet of the forward link
+///   byte      width  lookup name   shown as
+///   14        32                   sequence number
+///   18               kRLDataRate   three blocks of counters, 576 bytes apart: their weighted sum
+///                                  since the last packet
+///
+///   a block: for each of the twelve rates, 24 bytes apart, two rows of four counters
+///   0         4 x 32
+///   288       4 x 32
+void parseReverseDataRate(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+} // namespace pallax

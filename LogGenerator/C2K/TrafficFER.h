@@ -1,0 +1,26 @@
+#pragma once
+
+#include "platform/PropertyList.h"
+
+#include <optional>
+
+namespace pallax {
+
+/// The frame error rate of the 1x traffic channel, an exponential average between 0 and 1 that
+/// lives in the state under "TrafficFER" for as long as a call. Single precision throughout.
+
+/// The rate so far; nothing when no call has reported a frame yet.
+std::optional<float> trafficFER(const Dictionary& state);
+
+/// Adds a frame with the weight 1/64 and gives the new rate, which is kept.
+float addTrafficFrame(bool inError, Dictionary& state);
+
+/// Forgets the rate, so that the next call starts anew.
+void endTrafficFER(Dictionary& state);
+
+/// A rate as shown: in per cent.
+PropertyList shownTrafficFER(float rate);
+/// The same, of a call that is over.
+PropertyList shownOldTrafficFER(float rate);
+
+} // namespace pallax

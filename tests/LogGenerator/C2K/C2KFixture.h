@@ -1,0 +1,190 @@
+#pragma once
+
+#include "LogGenerator/C2K/C2KLogGenerator.h"
+#include "app/tree/PallaxModelNode.h"
+#include "tests/doubles/GeneratorFixture.h"
+#include "tests/doubles/RecordProperties.h"
+
+#include <rapidcheck.h>
+
+#include <algorithm>
+#include <string>
+#include <vector>
+
+namespace pallax::doubles {
+
+/// Every name that some parser fills.
+inline const std::vector<std::string> kLookupNames = {
+    "kChannel",
+    "kBandClass",
+    "kSystemId",
+    "kNetworkId",
+    "kBaseId",
+    "kPacketZoneId",
+    "kProtocolRevision",
+    "kServingPNOffset",
+    "k1xDeviceState",
+    "k1xEVDODeviceState",
+    "k1xRoamingHome",
+    "k1xRx0BandClass",
+    "k1xRx0ChanNum",
+    "k1xRx1BandClass",
+    "k1xRx1ChanNum",
+    "k1xRxAGC0",
+    "k1xRxAGC1",
+    "k1xTxAGC",
+    "k1xTrafficFER",
+    "k1xActiveSetInfo",
+    "kRxAGC0",
+    "kRxAGC1",
+    "kTxAGC",
+    "kFLDataRate",
+    "kRLDataRate",
+    "kActiveSetPilots",
+    "kFingerC2I",
+    "kColorCode",
+    "kSessionState",
+    "kUATI24",
+};
+
+/// A template with one row for each lookup name, called like it.
+inline PropertyList flatTemplate() {
+    Dictionary rows;
+    for (const std::string& name : kLookupNames) {
+        rows.set(name, name);
+    }
+    return rows;
+}
+
+/// What the start of a test says was shown before, under every name.
+constexpr const char* kBefore = "what was shown before";
+
+/// A generator over the flat template, fed with stripped packets and read back.
+class C2KFixture {
+public:
+    C2KFixture() {
+        _fixture.resources.add("C2KTemplate", flatTemplate());
+        (void)generator.getDisplayFromState(state);
+        (void)_log.take();
+    }
+
+    /// Feeds a packet without prefix. Kept are the lines that its parser logs, without the two that
+    /// the framing logs for every such packet.
+    void feed(const ByteBuffer& bytes) {
+        generator.updateState(state, bytes);
+        lines = _log.take();
+        std::erase_if(lines, [](const RecordingLog::Line& line) {
+            return line.text.starts_with("Log Header ") ||
+                   line.text.starts_with("Returning buffer without modifications ");
+        });
+    }
+    void feed(const Record& record) { feed(record.bytes()); }
+
+    /// Marks every row, so that one which is written can be told.
+    void mark() {
+        for (const std::string& name : kLookupNames) {
+            display()->set(name, kBefore);
+        }
+    }
+    /// The rows that a packet has written since they were marked, by name.
+    Dictionary written() {
+        Dictionary rows;
+        for (const std::string& name : kLookupNames) {
+            if (const PropertyList& value = *display()->find(name);
+                !(value == PropertyList(kBefore))) {
+                rows.set(name, value);
+            }
+        }
+        return rows;
+    }
+    /// What a packet writes into the marked rows.
+    Dictionary writtenBy(const Record& record) {
+        mark();
+        feed(record);
+        return written();
+    }
+
+    DictionaryRef display() { return state.find("Display")->dictionary(); }
+    const PropertyList& value(std::string_view name) { return *display()->find(name); }
+    std::string text(std::string_view name) { return value(name).string().value_or("(no text)"); }
+    DictionaryRef extraInfo() { return state.find("ExtraInfo")->dictionary(); }
+    /// An integer of the state; -1 without it.
+    std::int64_t kept(std::string_view key) {
+        const PropertyList* found = state.find(key);
+        return found != nullptr ? found->integer().value_or(-1) : -1;
+    }
+
+private:
+    GeneratorFixture _fixture;
+    RecordingLog _log;
+
+public:
+    C2KLogGenerator generator{_fixture.environment()};
+    Dictionary state;
+    std::vector<RecordingLog::Line> lines; ///< what the last packet's parser logged
+};
+
+/// "(name: value, name: value)": a list by pilot as the display tree shows it; "(no list)" where
+/// there is no branch.
+inline std::string shownList(const PropertyList& list) {
+    PathDictionary paths;
+    const NodeRef root = PallaxModelNode::makeTreeFromObject(Dictionary{{"List", list}}, paths);
+    const auto* children = paths.at("/List")->childNodes();
+    if (children == nullptr) {
+        return "(no list)";
+    }
+    std::string text;
+    for (const NodeRef& child : *children) {
+        text += text.empty() ? "" : ", ";
+        text += child->displayName() + ": " + child->value()->string().value_or("(no text)");
+    }
+    return "(" + text + ")";
+}
+
+/// Feeds a packet cut at every length to a fixture; below `minimum` it must write nothing.
+/// Each cut is a buffer of its own, so that a sanitizer sees a read outside.
+inline void cutPacketAtEveryLength(const Record& record, std::size_t minimum) {
+    C2KFixture fixture;
+    for (std::size_t length = 0; length < record.bytes().size(); ++length) {
+        fixture.mark();
+        fixture.feed(ByteBuffer(record.bytes().begin(),
+                                record.bytes().begin() + static_cast<std::ptrdiff_t>(length)));
+        if (length < minimum) {
+            EXPECT_EQ(PropertyList(fixture.written()), PropertyList(Dictionary()))
+                << "cut at " << length;
+        }
+        (void)PropertyList(fixture.written()).description();
+    }
+}
+
+/// Any bytes behind a header of that code, small ones in half of the cases; as many as one of
+/// `lengths` says (of the whole packet), or any up to the largest.
+inline Record anyPacket(LogCode code, const std::vector<std::size_t>& lengths) {
+    constexpr unsigned kSmall = 5;
+    constexpr unsigned kAny = 256;
+    const std::size_t largest = *std::max_element(lengths.begin(), lengths.end());
+    const auto length = *rc::gen::arbitrary<bool>()
+                            ? *rc::gen::elementOf(lengths)
+                            : *rc::gen::inRange(LogRecord::kHeaderLength, largest + 1);
+    const unsigned bound = *rc::gen::element(kSmall, kAny);
+    const ByteBuffer payload = *bytesBelow(bound, length - LogRecord::kHeaderLength);
+    return Record(code).append(Bytes(payload));
+}
+
+/// Holds that packets of any bytes under a code write no other rows; every text is made once.
+inline void anyPacketWritesOnly(LogCode code, const std::vector<std::string>& names,
+                                const std::vector<std::size_t>& lengths) {
+    EXPECT_TRUE(rc::check([&names, code, &lengths] {
+        C2KFixture fixture;
+        fixture.mark();
+        for (int count = *rc::gen::inRange(1, 4); count > 0; --count) {
+            fixture.feed(anyPacket(code, lengths));
+        }
+        for (const Dictionary::Entry& row : fixture.written()) {
+            RC_ASSERT(std::find(names.begin(), names.end(), row.key.string()) != names.end());
+            (void)row.value.description();
+        }
+    }));
+}
+
+} // namespace pallax::doubles
