@@ -20,7 +20,7 @@ constexpr double kHysteresis_db = 3;
 constexpr int kPatience = 4; // updates for which another cell has to be better
 
 /// The cells lie on a square grid, each a little off its place.
-Position siteOf(const LayerPlan& plan, unsigned site, Random& random) {
+PlanePoint siteOf(const LayerPlan& plan, unsigned site, Random& random) {
     constexpr double kOff = 0.18; // of the spacing
     const double half = (plan.sitesPerSide - 1) / 2.0;
     const double column = site % plan.sitesPerSide + random.between(-kOff, kOff) - half;
@@ -28,7 +28,7 @@ Position siteOf(const LayerPlan& plan, unsigned site, Random& random) {
     return {column * plan.spacing_m, row * plan.spacing_m};
 }
 
-double rawLevel_dbm(const LayerPlan& plan, const Cell& cell, Position phone) {
+double rawLevel_dbm(const LayerPlan& plan, const Cell& cell, PlanePoint phone) {
     const double dx = cell.position.x_m - phone.x_m;
     const double dy = cell.position.y_m - phone.y_m;
     constexpr double kSquareMetres = 1e6;
@@ -38,7 +38,7 @@ double rawLevel_dbm(const LayerPlan& plan, const Cell& cell, Position phone) {
 
 } // namespace
 
-RadioLayer::RadioLayer(const LayerPlan& plan, Random& random, Position phone) : _plan(plan) {
+RadioLayer::RadioLayer(const LayerPlan& plan, Random& random, PlanePoint phone) : _plan(plan) {
     constexpr unsigned kCodeStep = 101; // prime, so that no two cells share a code
     constexpr unsigned kChannelStep = 7;
     const unsigned count = plan.sitesPerSide * plan.sitesPerSide;
@@ -62,7 +62,7 @@ RadioLayer::RadioLayer(const LayerPlan& plan, Random& random, Position phone) : 
     rankNeighbours();
 }
 
-void RadioLayer::update(Position phone, double moved_m, double shadow, Random& random) {
+void RadioLayer::update(PlanePoint phone, double moved_m, double shadow, Random& random) {
     const double kept = std::exp(-moved_m / kShadowingDistance_m);
     const double renewed_db = kShadowing_db * std::sqrt(1 - kept * kept);
     for (std::size_t cell = 0; cell < _cells.size(); ++cell) {

@@ -34,7 +34,7 @@ struct Cell {
     unsigned code = 0; ///< physical cell ID, scrambling code, colour code or pilot
     std::uint32_t identity = 0;
     unsigned area = 0;
-    Position position;
+    PlanePoint position;
 };
 
 /// The cells of one technology and how the phone hears them: path loss over the distance,
@@ -44,10 +44,10 @@ class RadioLayer {
 public:
     static constexpr std::size_t kMostHeard = 9;
 
-    RadioLayer(const LayerPlan& plan, Random& random, Position phone);
+    RadioLayer(const LayerPlan& plan, Random& random, PlanePoint phone);
 
     /// The phone has moved `moved_m` to `phone`, where a hill shadows it so much (0 to 1).
-    void update(Position phone, double moved_m, double shadow, Random& random);
+    void update(PlanePoint phone, double moved_m, double shadow, Random& random);
 
     const std::vector<Cell>& cells() const { return _cells; }
     double level_dbm(std::size_t cell) const { return _levels_dbm[cell]; }

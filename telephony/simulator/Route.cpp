@@ -23,14 +23,14 @@ constexpr std::array<Hill, 3> kHills = {{{330, 260}, {2900, 420}, {5600, 300}}};
 /// Over so many metres the shadow comes and goes.
 constexpr double kSlope_m = 60;
 
-double distance(const Position& a, const Position& b) {
+double distance(const PlanePoint& a, const PlanePoint& b) {
     return std::sqrt((a.x_m - b.x_m) * (a.x_m - b.x_m) + (a.y_m - b.y_m) * (a.y_m - b.y_m));
 }
 
 } // namespace
 
 Route::Route(Random& random) {
-    Position direction{1, 0};
+    PlanePoint direction{1, 0};
     for (int corner = 0; corner < kCorners; ++corner) {
         const double radius_m = random.between(kNearest_m, kFarthest_m);
         _corners.push_back({direction.x_m * radius_m, direction.y_m * radius_m});
@@ -49,12 +49,12 @@ double Route::withinRound(double distance_m) const {
     return std::fmod(distance_m, length_m());
 }
 
-Position Route::at(double distance_m) const {
+PlanePoint Route::at(double distance_m) const {
     const double place_m = withinRound(distance_m);
     const auto next = std::upper_bound(_starts.begin() + 1, _starts.end() - 1, place_m);
     const auto street = static_cast<std::size_t>(next - _starts.begin()) - 1;
-    const Position& from = _corners[street];
-    const Position& to = _corners[(street + 1) % _corners.size()];
+    const PlanePoint& from = _corners[street];
+    const PlanePoint& to = _corners[(street + 1) % _corners.size()];
     const double part = (place_m - _starts[street]) / (_starts[street + 1] - _starts[street]);
     return {from.x_m + (to.x_m - from.x_m) * part, from.y_m + (to.y_m - from.y_m) * part};
 }

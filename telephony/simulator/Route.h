@@ -7,7 +7,7 @@
 namespace pallax {
 
 /// On the plane of the scenario, in metres east and north of its middle.
-struct Position {
+struct PlanePoint {
     double x_m = 0;
     double y_m = 0;
 };
@@ -20,14 +20,14 @@ public:
 
     double length_m() const { return _starts.back(); }
     /// `distance_m` from the start, any number of rounds on.
-    Position at(double distance_m) const;
+    PlanePoint at(double distance_m) const;
     /// How deep in a hill's shadow: 0 (not at all) to 1.
     double shadowAt(double distance_m) const;
 
 private:
     double withinRound(double distance_m) const;
 
-    std::vector<Position> _corners;
+    std::vector<PlanePoint> _corners;
     std::vector<double> _starts; // of each street, and where the last one ends
 };
 

@@ -13,7 +13,7 @@ constexpr double kFastest_mps = 17;
 
 Scenario::Scenario(const ScenarioPlan& plan, std::uint64_t seed)
     : _random(seed), _route(_random), _fallback(plan.fallback), _activity(_random) {
-    const Position start = _route.at(0);
+    const PlanePoint start = _route.at(0);
     _layers.reserve(plan.layers.size());
     for (const LayerPlan& layer : plan.layers) {
         _layers.emplace_back(layer, _random, start);
@@ -39,7 +39,7 @@ void Scenario::move() {
         std::clamp(_speed_mps + _random.normal() * kSpeedChange_mps, kSlowest_mps, kFastest_mps);
     const double moved_m = _speed_mps * kStep_s;
     _distance_m += moved_m;
-    const Position phone = _route.at(_distance_m);
+    const PlanePoint phone = _route.at(_distance_m);
     const double shadow = _route.shadowAt(_distance_m);
     for (RadioLayer& layer : _layers) {
         layer.update(phone, moved_m, shadow, _random);

@@ -2,6 +2,7 @@
 
 #include "host/Recording.h"
 #include "telephony/simulator/RecordWriter.h"
+#include "telephony/simulator/gsm/GsmModem.h"
 #include "telephony/simulator/lte/LteModem.h"
 
 #include <array>
@@ -28,6 +29,7 @@ SimulatedTechnology simulated(std::string_view commandName) {
 
 const auto& table() {
     static const auto technologies = std::to_array<SimulatedTechnology>({
+        simulated<GsmModem>("gsm"),
         simulated<LteModem>("lte"),
     });
     return technologies;
