@@ -2,8 +2,11 @@
 
 #include "host/Recording.h"
 #include "telephony/simulator/RecordWriter.h"
+#include "telephony/simulator/cdma/CdmaModem.h"
 #include "telephony/simulator/gsm/GsmModem.h"
+#include "telephony/simulator/ifx/IfxModem.h"
 #include "telephony/simulator/lte/LteModem.h"
+#include "telephony/simulator/utran/UtranModem.h"
 
 #include <array>
 #include <stdexcept>
@@ -29,8 +32,11 @@ SimulatedTechnology simulated(std::string_view commandName) {
 
 const auto& table() {
     static const auto technologies = std::to_array<SimulatedTechnology>({
+        simulated<IfxModem>("ifx"),
         simulated<GsmModem>("gsm"),
+        simulated<CdmaModem>("cdma"),
         simulated<LteModem>("lte"),
+        simulated<UtranModem>("utran"),
     });
     return technologies;
 }

@@ -35,7 +35,6 @@ const std::map<std::string_view, std::set<std::string>> kNeverFilled = {
      {"Coding Scheme", "UMTS RR Measurement", "Cell Change Counters", "Non-Ranked GSM Set",
       "Non-Ranked UMTS Set", "Detected Set", "Monitored Set", "Virtual Active Set"}},
     {"utran", {"GSM Neighbor Cell List"}},
-    {"ifx", {"Barred Cells"}},
 };
 
 std::set<std::string> neverFilled(std::string_view technology) {
