@@ -12,10 +12,11 @@ namespace {
 /// Linear energies for each whole dB below full scale, each in the middle of what is read as that
 /// dB.
 std::uint32_t energyOf(int ecno_db) {
+    static constexpr int kSteps = 25;
     static const auto energies = [] {
         constexpr double kFullScale = 524288;
         constexpr double kHalfBand = 0.45; // of a dB, inside of the band
-        std::array<std::uint32_t, 32> table{};
+        std::array<std::uint32_t, kSteps> table{};
         for (std::size_t below = 1; below < table.size(); ++below) {
             table[below] = static_cast<std::uint32_t>(
                 kFullScale * std::pow(10.0, -(static_cast<double>(below) - kHalfBand) / 10));
@@ -23,7 +24,7 @@ std::uint32_t energyOf(int ecno_db) {
         table[0] = static_cast<std::uint32_t>(kFullScale);
         return table;
     }();
-    return energies[static_cast<std::size_t>(std::clamp(-ecno_db, 0, 31))];
+    return energies[static_cast<std::size_t>(std::clamp(-ecno_db, 0, kSteps - 1))];
 }
 
 constexpr int kTenths = 10;

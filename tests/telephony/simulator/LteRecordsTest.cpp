@@ -1,9 +1,7 @@
 #include "telephony/simulator/lte/LteRecords.h"
 
 #include "platform/Format.h"
-#include "tests/telephony/simulator/SimulatedPhone.h"
-
-#include <rapidcheck.h>
+#include "tests/telephony/simulator/Values.h"
 
 #include <array>
 
@@ -11,15 +9,6 @@
 
 namespace pallax {
 namespace {
-
-unsigned below(unsigned bound) {
-    return *rc::gen::inRange(0U, bound);
-}
-
-/// A level on the grid of a record: `least` plus a number of steps.
-double onGrid(double least, double step, unsigned count) {
-    return least + step * below(count);
-}
 
 std::string dbm(double level) {
     return formatText("%4.2f dBm", {level});
@@ -31,9 +20,7 @@ std::string db(double quality) {
 template <class Value>
 DecodedDisplay shown(const Value& value) {
     DecodedDisplay decoded("lte");
-    ByteBuffer bytes;
-    lte::encode(value, bytes);
-    decoded.feed(bytes);
+    feedEncoded(decoded, value);
     return decoded;
 }
 

@@ -51,7 +51,9 @@ TEST(LteSimulation, TheRecordsAgreeAboutTheServingCellAndItsNeighbours) {
     for (std::uint64_t seed = 0; seed < kSeeds && !testing::Test::HasFailure(); ++seed) {
         SCOPED_TRACE("seed " + std::to_string(seed));
         DecodedDisplay decoded("lte");
-        Simulation simulation(simulationOf("lte", seed, seconds(60)));
+        SimulationOptions options = simulationOf("lte", seed, seconds(60));
+        options.packetsPerSecond = 5;
+        Simulation simulation(options);
         while (const auto packet = simulation.next()) {
             const std::string before = decoded.text(kInfo, "Physical Cell ID");
             const std::string identity = decoded.text(kInfo, "Cell Identity");
@@ -72,7 +74,9 @@ TEST(LteSimulation, LevelsAreInRangeAndMoveSmoothlyWhileOneCellServes) {
     for (std::uint64_t seed = 0; seed < kSeeds && !testing::Test::HasFailure(); ++seed) {
         SCOPED_TRACE("seed " + std::to_string(seed));
         DecodedDisplay decoded("lte");
-        Simulation simulation(simulationOf("lte", seed, seconds(60)));
+        SimulationOptions options = simulationOf("lte", seed, seconds(30));
+        options.packetsPerSecond = 10;
+        Simulation simulation(options);
         std::string cell;
         double last_dbm = 0;
         Time lastTime = Simulation::kStart;
@@ -103,7 +107,9 @@ TEST(LteSimulation, LevelsAreInRangeAndMoveSmoothlyWhileOneCellServes) {
 
 TEST(LteSimulation, InTenMinutesThePhoneVisitsManyCellsAndCandidatesOfEveryTechnology) {
     DecodedDisplay decoded("lte");
-    Simulation simulation(simulationOf("lte", 5, seconds(600)));
+    SimulationOptions options = simulationOf("lte", 5, seconds(600));
+    options.packetsPerSecond = 5;
+    Simulation simulation(options);
     std::set<std::string> cells;
     std::set<std::string> technologies;
     std::set<std::string> areas;
