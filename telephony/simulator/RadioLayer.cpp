@@ -63,7 +63,14 @@ RadioLayer::RadioLayer(const LayerPlan& plan, Random& random, PlanePoint phone) 
 }
 
 void RadioLayer::update(PlanePoint phone, double moved_m, double shadow, Random& random) {
-    const double kept = std::exp(-moved_m / kShadowingDistance_m);
+    _hasChanged = false;
+    _movedSince_m += moved_m;
+    if (++_stepsSince < _plan.updateEvery) {
+        return;
+    }
+    const double kept = std::exp(-_movedSince_m / kShadowingDistance_m);
+    _stepsSince = 0;
+    _movedSince_m = 0;
     const double renewed_db = kShadowing_db * std::sqrt(1 - kept * kept);
     for (std::size_t cell = 0; cell < _cells.size(); ++cell) {
         _shadows_db[cell] = _shadows_db[cell] * kept + random.normal() * renewed_db;
@@ -85,7 +92,6 @@ void RadioLayer::hear(std::size_t cell, double rawLevel_dbm) {
 
 void RadioLayer::reselect() {
     const auto best = std::max_element(_levels_dbm.begin(), _levels_dbm.end());
-    _hasChanged = false;
     if (*best < campedLevel_dbm() + kHysteresis_db) {
         _betterSince = 0;
     } else if (++_betterSince >= kPatience) {

@@ -26,6 +26,7 @@ struct LayerPlan {
     double power_dbm = 30;   ///< radiated, in the bandwidth that the level is told of
     double least_dbm = -130; ///< what is weaker is not heard
     double hillLoss_db = 0;  ///< in the deepest shadow
+    int updateEvery = 1;     ///< steps: what the phone does not serve on it measures less often
 };
 
 /// A cell's unchanging properties.
@@ -79,6 +80,8 @@ private:
     std::size_t _camped = 0;
     double _total_dbm = 0;
     int _betterSince = 0; // updates
+    int _stepsSince = 0;  // the latest update
+    double _movedSince_m = 0;
     bool _hasChanged = true;
 };
 

@@ -12,7 +12,7 @@ namespace {
 /// Linear energies for each whole dB below full scale, each in the middle of what is read as that
 /// dB.
 std::uint32_t energyOf(int ecno_db) {
-    static constexpr int kSteps = 25;
+    static constexpr int kSteps = 23;
     static const auto energies = [] {
         constexpr double kFullScale = 524288;
         constexpr double kHalfBand = 0.45; // of a dB, inside of the band

@@ -13,7 +13,7 @@ namespace pallax::gsm {
 struct SearchedCell {
     unsigned scramblingCode;
     bool active;
-    int ecno_db; ///< part of the carrier, -1 to -24: below, the energies have no even steps
+    int ecno_db; ///< part of the carrier, -1 to -22: below, the energies have no even steps
 };
 struct Searcher {
     int carrier_dbm;

@@ -63,7 +63,7 @@ void reportSearcher(const Scenario& scenario, Random& random, ByteBuffer& out) {
     visitCells(scenario, [&](std::size_t index) {
         const double ecno = ecno_db(scenario, layer.level_dbm(index));
         cells[count++] = {layer.cells()[index].code, index == layer.camped(),
-                          std::clamp(whole(measured(ecno, kNoise_db, random)), -24, -1)};
+                          std::clamp(whole(measured(ecno, kNoise_db, random)), -22, -1)};
     });
     encode(Searcher{whole(carrier_dbm), std::span(cells.data(), count)}, out);
 }

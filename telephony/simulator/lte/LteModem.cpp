@@ -180,7 +180,7 @@ ScenarioPlan LteModem::plan() {
                          .spacing_m = 800,
                          .power_dbm = 24,
                          .least_dbm = -112};
-    const LayerPlan other = {.sitesPerSide = 4, .spacing_m = 1100};
+    const LayerPlan other = {.sitesPerSide = 4, .spacing_m = 1100, .updateEvery = 5};
     plan.layers[kOtherLte] = other;
     plan.layers[kOtherLte].firstChannel = 3300;
     plan.layers[kUtran] = other;

@@ -125,7 +125,8 @@ ScenarioPlan UtranModem::plan() {
                          .sitesPerSide = 4,
                          .spacing_m = 1100,
                          .power_dbm = 40,
-                         .least_dbm = -104};
+                         .least_dbm = -104,
+                         .updateEvery = 3};
     return plan;
 }
 

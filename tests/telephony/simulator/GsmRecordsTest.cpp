@@ -165,7 +165,7 @@ TEST(GsmRecords, TheSearchersActiveCellsAreShownAsEncoded) {
         const int carrier_dbm = between(-105, -30);
         Array expected;
         for (gsm::SearchedCell& cell : cells) {
-            cell = {below(512), below(2) == 1, between(-24, 0)};
+            cell = {below(512), below(2) == 1, between(-22, 0)};
             if (cell.active) {
                 expected.emplace_back(
                     Dictionary{{"Scrambling Code", text(cell.scramblingCode)},
