@@ -83,7 +83,8 @@ ExitStatus browse(const Request& request, SocketDirectory directory, ChildServic
     }
     const bool isContented = endChild(*child);
     if (!isWhole) {
-        complain("The service that plays the recording has ended.");
+        complain(request.options.simulation ? "The service that simulates the modem has ended."
+                                            : "The service that plays the recording has ended.");
     }
     return isWhole && isContented ? kExitSuccess : kExitFailure;
 }
@@ -112,8 +113,12 @@ ExitStatus browseWithLog(const Request& request) {
         return kExitWrongUsage;
     }
     std::unique_ptr<ChildService> child;
-    if (recording) {
-        auto started = ChildService::start({*recording, request.options.play});
+    if (recording || request.options.simulation) {
+        ServiceOptions service;
+        service.recording = recording.value_or("");
+        service.play = request.options.play;
+        service.simulation = request.options.simulation;
+        auto started = ChildService::start(std::move(service));
         if (!started) {
             complain(started.error().sentence);
             return kExitFailure;

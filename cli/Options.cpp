@@ -1,5 +1,7 @@
 #include "cli/Options.h"
 
+#include "cli/OptionParts.h"
+
 #include <CLI/CLI.hpp>
 
 #include <algorithm>
@@ -15,6 +17,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax                               browse the live modem
   pallax drive.pcap --speed 4          browse a recording, four times as fast
   modem-dump | pallax -                browse what another program records
+  pallax demo                          browse a simulated modem
   pallax decode drive.pcap             its last display as JSON
   pallax decode --every tick --format csv drive.pcap > drive.csv
   pallax record drive.pcapng           write what the live modem sends to a file
@@ -43,6 +46,7 @@ Recording ends with Ctrl-C, and with the source. A viewer may run at the same ti
 constexpr const char* kServiceFooter = R"(Examples:
   pallax service --play drive.pcap
   pallax service --play drive.pcap --speed max --loop
+  pallax service --simulate lte --seed 7
   ssh phone modem-dump | pallax service --relay -
   pallax service --status
 
@@ -51,39 +55,8 @@ goes to all as it comes, and the service ends with it. A client that is too slow
 delays nobody; with --speed max it sets its own pace and loses nothing.)";
 
 void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
-    const auto takeSpeed = [&play](const std::string& text) {
-        const auto speed = parseSpeed(text);
-        if (!speed) {
-            throw CLI::ValidationError("--speed",
-                                       "\"" + text + "\" is neither a number above 0 nor max");
-        }
-        play.speed = *speed;
-    };
-    app.add_option_function<std::string>("--speed", takeSpeed,
-                                         "Play that many times as fast; max: as fast as possible")
-        ->type_name("X|max")
-        ->needs(recording);
+    addSpeed(app, play)->needs(recording);
     app.add_flag("--loop", play.loop, "Begin again at the recording's end")->needs(recording);
-}
-
-/// Every choice goes by its name in the map, in the help and in the message about a wrong one.
-template <class Value>
-void addChoice(CLI::App& app, const std::string& name, Value& value,
-               const std::vector<std::pair<std::string, Value>>& choices,
-               const std::string& description) {
-    std::string names;
-    for (const auto& choice : choices) {
-        names += (names.empty() ? "" : "|") + choice.first;
-    }
-    const auto take = [name, &value, choices, names](const std::string& text) {
-        const auto found = std::find_if(choices.begin(), choices.end(),
-                                        [&](const auto& choice) { return choice.first == text; });
-        if (found == choices.end()) {
-            throw CLI::ValidationError(name, "\"" + text + "\" is none of " + names);
-        }
-        value = found->second;
-    };
-    app.add_option_function<std::string>(name, take, description)->type_name(names);
 }
 
 void addLogLevel(CLI::App& app, std::optional<int>& level) {
@@ -94,13 +67,8 @@ void addLogLevel(CLI::App& app, std::optional<int>& level) {
         ->type_name("0-7");
 }
 
-void addBrowse(CLI::App& app, BrowseOptions& options) {
-    CLI::Option* recording =
-        app.add_option(
-               "RECORDING", options.recording,
-               "A recording (pcap or pcapng; - is standard input) to browse as it is played; "
-               "without one, the live modem")
-            ->type_name("");
+/// What is common to all ways of browsing.
+void addView(CLI::App& app, BrowseOptions& options) {
     app.add_flag("--print", options.print,
                  "Print the tree as text at each display tick, as is done without a terminal");
     addChoice<terminal::ColorUse>(
@@ -112,7 +80,6 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
     app.add_flag_callback(
         "--no-mouse", [&options] { options.mouse = false; },
         "Leave the mouse to the terminal, so that text can be selected");
-    addPlay(app, options.play, recording);
     app.add_flag("--keep-going", options.keepGoing,
                  "Drop a record that cannot be read instead of ending with status 70");
     addLogLevel(app, options.logLevel);
@@ -125,6 +92,17 @@ void addTechnology(CLI::App& app, const RecordedTechnology*& technology,
         technologies.emplace_back(each.commandName, &each);
     }
     addChoice(app, "--technology", technology, technologies, description);
+}
+
+void addBrowse(CLI::App& app, BrowseOptions& options) {
+    CLI::Option* recording =
+        app.add_option(
+               "RECORDING", options.recording,
+               "A recording (pcap or pcapng; - is standard input) to browse as it is played; "
+               "without one, the live modem")
+            ->type_name("");
+    addView(app, options);
+    addPlay(app, options.play, recording);
 }
 
 void addDecode(CLI::App& app, DecodeOptions& options) {
@@ -201,6 +179,10 @@ void addServicePlay(CLI::App& app, ServiceOptions& options) {
     addPlay(app, options.play, recording);
 }
 
+void addServiceSimulated(CLI::App& app, std::optional<SimulationOptions>& simulation) {
+    addServiceSimulation(app, simulation)->excludes("--play");
+}
+
 void addServiceRelay(CLI::App& app, std::string& relayed) {
     const auto take = [&relayed](const std::string& text) {
         if (text != "-") {
@@ -211,17 +193,20 @@ void addServiceRelay(CLI::App& app, std::string& relayed) {
     app.add_option_function<std::string>(
            "--relay", take, "Pass on the live pcap stream of standard input (-) to every client")
         ->type_name("-")
-        ->excludes("--play");
+        ->excludes("--play")
+        ->excludes("--simulate");
 }
 
 void addServiceStatus(CLI::App& app, bool& status) {
     app.add_flag("--status", status, "Print what the running service serves, and end")
         ->excludes("--play")
+        ->excludes("--simulate")
         ->excludes("--relay");
 }
 
 void addService(CLI::App& app, ServiceRequest& request) {
     addServicePlay(app, request.options);
+    addServiceSimulated(app, request.options.simulation);
     addServiceRelay(app, request.relayed);
     addServiceStatus(app, request.status);
     app.footer(kServiceFooter);
@@ -236,8 +221,8 @@ ParsedOptions serviceOptions(const ServiceRequest& request) {
         options.recording = request.relayed;
         options.relay = true;
     }
-    if (options.recording.empty()) {
-        return wrongUsage("the service needs --play, --relay or --status");
+    if (options.recording.empty() && !options.simulation) {
+        return wrongUsage("the service needs --play, --simulate, --relay or --status");
     }
     return options;
 }
@@ -293,6 +278,16 @@ ParsedOptions parseOptions(std::vector<std::string> arguments) {
         app.add_subcommand("service", "Run the telephony service that viewers connect to");
     prepare(*serviceApp);
     addService(*serviceApp, service);
+    BrowseOptions demo;
+    CLI::App* demoApp = app.add_subcommand("demo", "Browse a simulated modem");
+    prepare(*demoApp);
+    addDemo(*demoApp, demo.simulation.emplace(), demo.play);
+    addView(*demoApp, demo);
+    SimulateOptions simulate;
+    CLI::App* simulateApp =
+        app.add_subcommand("simulate", "Write a simulated modem's packets as a recording");
+    prepare(*simulateApp);
+    addSimulate(*simulateApp, simulate);
 
     const std::string first = arguments.empty() ? "" : arguments.front();
     std::reverse(arguments.begin(), arguments.end()); // as CLI11 takes them
@@ -323,6 +318,12 @@ ParsedOptions parseOptions(std::vector<std::string> arguments) {
     }
     if (serviceApp->parsed()) {
         return serviceOptions(service);
+    }
+    if (demoApp->parsed()) {
+        return demo;
+    }
+    if (simulateApp->parsed()) {
+        return simulate;
     }
     return browse;
 }

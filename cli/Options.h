@@ -3,6 +3,7 @@
 #include "cli/DecodeCommand.h"
 #include "cli/ExitStatus.h"
 #include "cli/RecordOptions.h"
+#include "cli/SimulateOptions.h"
 #include "telephony/Service.h"
 #include "ui/terminal/CursesTerminal.h"
 
@@ -14,7 +15,8 @@
 namespace pallax {
 
 struct BrowseOptions {
-    std::optional<std::string> recording; ///< without one, the live modem
+    std::optional<std::string> recording;        ///< without one, the live modem
+    std::optional<SimulationOptions> simulation; ///< or a simulated modem
     PlayOptions play;
     bool print = false;
     terminal::ColorUse color = terminal::ColorUse::Auto;
@@ -33,7 +35,7 @@ struct ParseEnd {
 struct ServiceStatusOptions {};
 
 using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions,
-                                   ServiceStatusOptions, ParseEnd>;
+                                   ServiceStatusOptions, SimulateOptions, ParseEnd>;
 
 /// `arguments` are those after the program's name.
 ParsedOptions parseOptions(std::vector<std::string> arguments);

@@ -2,6 +2,7 @@
 #include "cli/Output.h"
 #include "cli/Programs.h"
 #include "telephony/ChildService.h"
+#include "telephony/simulator/SimulatedRecording.h"
 
 #include <csignal>
 #include <cstdio>
@@ -23,6 +24,13 @@ struct Run {
     }
     ExitStatus operator()(const ServiceStatusOptions& /*options*/) const {
         return printServiceStatus() == 0 ? kExitSuccess : kExitFailure;
+    }
+    ExitStatus operator()(const SimulateOptions& options) const {
+        if (const auto error = writeSimulatedRecording(options.simulation, options.file)) {
+            complain(error->sentence);
+            return kExitFailure;
+        }
+        return kExitSuccess;
     }
     ExitStatus operator()(const ParseEnd& end) const {
         const bool wanted = end.status == kExitSuccess;

@@ -35,16 +35,17 @@ ByteBuffer fileHeader(int linkType) {
 
 } // namespace
 
-Result<std::unique_ptr<RecordingWriter>, HostError> RecordingWriter::create(const std::string& path,
-                                                                            int linkType) {
+Result<std::unique_ptr<RecordingWriter>, HostError>
+RecordingWriter::create(const std::string& path, int linkType, Flush flush) {
     std::FILE* file = path == "-" ? stdout : std::fopen(path.c_str(), "wbe");
     if (file == nullptr) {
         return HostError{
             formatText("The recording %@ cannot be written: %@.", {path, std::strerror(errno)})};
     }
     std::unique_ptr<RecordingWriter> writer(
-        new RecordingWriter(path == "-" ? "standard output" : path, file));
-    if (auto error = writer->put(fileHeader(linkType))) {
+        new RecordingWriter(path == "-" ? "standard output" : path, file, flush));
+    writer->_pending = fileHeader(linkType);
+    if (auto error = writer->flush()) {
         return std::move(*error);
     }
     return writer;
@@ -67,20 +68,22 @@ std::optional<HostError> RecordingWriter::write(Time time, Bytes packet) {
     if (seconds < 0 || seconds > std::numeric_limits<std::uint32_t>::max()) {
         return HostError{"A packet before 1970 or after 2106 cannot be recorded."};
     }
-    constexpr std::size_t kPacketHeaderSize = 16;
-    ByteBuffer bytes;
-    bytes.reserve(kPacketHeaderSize + packet.size());
-    put32(bytes, static_cast<std::uint32_t>(seconds));
-    put32(bytes, static_cast<std::uint32_t>((time - second).count()));
-    put32(bytes, static_cast<std::uint32_t>(packet.size())); // captured
-    put32(bytes, static_cast<std::uint32_t>(packet.size())); // as it was
-    bytes.insert(bytes.end(), packet.begin(), packet.end());
-    return put(bytes);
+    constexpr std::size_t kBlockSize = std::size_t{256} << 10U;
+    put32(_pending, static_cast<std::uint32_t>(seconds));
+    put32(_pending, static_cast<std::uint32_t>((time - second).count()));
+    put32(_pending, static_cast<std::uint32_t>(packet.size())); // captured
+    put32(_pending, static_cast<std::uint32_t>(packet.size())); // as it was
+    _pending.insert(_pending.end(), packet.begin(), packet.end());
+    const bool isDue = _flush == Flush::EachPacket || _pending.size() >= kBlockSize;
+    return isDue ? flush() : std::nullopt;
 }
 
-std::optional<HostError> RecordingWriter::put(const ByteBuffer& bytes) {
-    if (std::fwrite(bytes.data(), 1, bytes.size(), _file) != bytes.size() ||
-        std::fflush(_file) != 0) {
+std::optional<HostError> RecordingWriter::flush() {
+    const bool isWritten =
+        std::fwrite(_pending.data(), 1, _pending.size(), _file) == _pending.size() &&
+        std::fflush(_file) == 0;
+    _pending.clear();
+    if (!isWritten) {
         return HostError{
             formatText("The recording %@ cannot be written: %@.", {_name, std::strerror(errno)})};
     }

@@ -13,16 +13,19 @@
 namespace pallax {
 
 /// Writes a recording: pcap with nanosecond stamps, little-endian on every machine, so the same
-/// packets give the same bytes. Each packet reaches the file before the next is taken: a crash
-/// loses at most the last one.
+/// packets give the same bytes. Each packet reaches the file before the next is taken, so that a
+/// crash loses at most the last one, unless packets are to be written in blocks.
 class RecordingWriter {
 public:
+    /// InBlocks: for packets that can be made again; `flush` has to follow the last one.
+    enum class Flush { EachPacket, InBlocks };
+
     /// The largest packet that readers of captures accept.
     static constexpr std::size_t kLargestPacket = 262144;
 
     /// An existing file is replaced; `path` "-" is standard output.
-    static Result<std::unique_ptr<RecordingWriter>, HostError> create(const std::string& path,
-                                                                      int linkType);
+    static Result<std::unique_ptr<RecordingWriter>, HostError>
+    create(const std::string& path, int linkType, Flush flush = Flush::EachPacket);
     ~RecordingWriter();
     RecordingWriter(const RecordingWriter&) = delete;
     RecordingWriter& operator=(const RecordingWriter&) = delete;
@@ -30,13 +33,17 @@ public:
     /// Nothing when the packet is written; else why it is not, and the recording is as before
     /// where the packet was refused for its size or time (1970 to 2106).
     std::optional<HostError> write(Time time, Bytes packet);
+    /// Brings everything to the file.
+    std::optional<HostError> flush();
 
 private:
-    RecordingWriter(std::string name, std::FILE* file) : _name(std::move(name)), _file(file) {}
-    std::optional<HostError> put(const ByteBuffer& bytes);
+    RecordingWriter(std::string name, std::FILE* file, Flush flush)
+        : _name(std::move(name)), _file(file), _flush(flush) {}
 
     std::string _name;
     std::FILE* _file;
+    Flush _flush;
+    ByteBuffer _pending;
 };
 
 } // namespace pallax

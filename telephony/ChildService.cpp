@@ -1,8 +1,10 @@
 #include "telephony/ChildService.h"
 
+#include "host/Recording.h"
 #include "host/SocketDirectory.h"
 #include "platform/Format.h"
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <charconv>
@@ -23,7 +25,19 @@ constexpr int kReadyDescriptor = 3;
 constexpr int kExecFailed = 127;
 
 // The child's arguments, after the program's name.
-enum Argument { kCommand = 1, kControlPort, kSpeed, kLoop, kInterval, kRecording, kArgumentCount };
+enum Argument {
+    kCommand = 1,
+    kControlPort,
+    kSpeed,
+    kLoop,
+    kInterval,
+    kRecording,
+    kTechnology, // of a simulation, or empty; then the simulation's numbers
+    kSeed,
+    kRate,
+    kSeconds,
+    kArgumentCount
+};
 constexpr std::string_view kLooping = "loop";
 constexpr std::string_view kOnce = "once";
 
@@ -64,13 +78,41 @@ bool waitUntilReady(const Descriptor& ready) {
 }
 
 std::vector<std::string> argumentsFor(const ServiceOptions& options) {
+    const SimulationOptions simulation = options.simulation.value_or(SimulationOptions{});
+    const auto* technology = simulation.technology;
     return {"pallax",
             std::string(kChildServiceCommand),
             options.controlPortName,
             speedText(options.play.speed),
             std::string(options.play.loop ? kLooping : kOnce),
             std::to_string(options.play.displayInterval.count()),
-            options.recording};
+            options.recording,
+            technology != nullptr ? std::string(technology->commandName) : std::string(),
+            std::to_string(simulation.seed),
+            std::to_string(simulation.packetsPerSecond),
+            std::to_string(simulation.duration.value_or(std::chrono::seconds(0)).count())};
+}
+
+template <class Number>
+Number numberOf(const std::string& text) {
+    Number number{};
+    (void)std::from_chars(text.data(), text.data() + text.size(), number);
+    return number;
+}
+
+/// Nothing when the arguments ask for a recording.
+std::optional<SimulationOptions> simulationOf(const std::vector<std::string>& arguments) {
+    SimulationOptions simulation;
+    simulation.technology = technologyOfCommandName(arguments[kTechnology]);
+    if (simulation.technology == nullptr) {
+        return std::nullopt;
+    }
+    simulation.seed = numberOf<std::uint64_t>(arguments[kSeed]);
+    simulation.packetsPerSecond = std::max(numberOf<unsigned>(arguments[kRate]), 1U);
+    if (const auto seconds = numberOf<std::int64_t>(arguments[kSeconds]); seconds > 0) {
+        simulation.duration = std::chrono::seconds(seconds);
+    }
+    return simulation;
 }
 
 /// In the child, between fork and exec: only what is safe there, and it does not return.
@@ -205,10 +247,8 @@ int runChildService(int argc, char** argv) {
     options.play.loop = arguments[kLoop] == kLooping;
     options.recording = arguments[kRecording];
     options.lossless = true; // its only client is the viewer that has started it
-    std::int64_t interval = 0;
-    const std::string& text = arguments[kInterval];
-    (void)std::from_chars(text.data(), text.data() + text.size(), interval);
-    if (interval > 0) {
+    options.simulation = simulationOf(arguments);
+    if (const auto interval = numberOf<std::int64_t>(arguments[kInterval]); interval > 0) {
         options.play.displayInterval = std::chrono::nanoseconds(interval);
     }
     return runService(options, [] {

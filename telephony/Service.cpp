@@ -7,6 +7,7 @@
 #include "telephony/ServiceStatus.h"
 #include "telephony/StreamSource.h"
 #include "telephony/TelephonyServer.h"
+#include "telephony/simulator/SimulatedSource.h"
 
 #include <array>
 #include <charconv>
@@ -42,6 +43,15 @@ Result<std::unique_ptr<PacketSource>, HostError> takeOnce(std::unique_ptr<Packet
 /// Fails at once for what no channel could play. `relayEnded` is called after a live stream's end.
 Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueue& queue,
                                      std::function<void(bool isOrderly)> relayEnded) {
+    if (options.simulation) {
+        const SimulationOptions simulation = *options.simulation;
+        return Program{std::string(simulation.technology->identifier),
+                       [simulation]() -> Result<std::unique_ptr<PacketSource>, HostError> {
+                           return std::unique_ptr<PacketSource>(
+                               std::make_unique<SimulatedSource>(simulation));
+                       },
+                       nullptr};
+    }
     auto recording = openKnownRecording(options.recording);
     if (!recording) {
         return recording.error();

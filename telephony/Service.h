@@ -2,6 +2,7 @@
 
 #include "telephony/ControlMessages.h"
 #include "telephony/PacketPlayer.h"
+#include "telephony/simulator/Simulation.h"
 
 #include <functional>
 #include <optional>
@@ -20,6 +21,7 @@ struct ServiceOptions {
     bool relay = false;
     /// Every client sets its own pace and loses nothing, whatever the speed.
     bool lossless = false;
+    std::optional<SimulationOptions> simulation = {}; ///< instead of a recording
 };
 
 /// "1.5", "max": how options say a speed.

@@ -134,8 +134,72 @@ TEST(Options, RecordWritesOneFileAndKeepsWhatExistsUnlessToldOtherwise) {
     EXPECT_EQ(told.logLevel, 6);
 }
 
+TEST(Options, ServiceSimulatesAModem) {
+    const auto options = parsed<ServiceOptions>(
+        {"service", "--simulate", "lte", "--seed", "18446744073709551615", "--rate", "50"});
+    ASSERT_TRUE(options.simulation);
+    EXPECT_EQ(options.simulation->technology->commandName, "lte");
+    EXPECT_EQ(options.simulation->seed, 18446744073709551615U);
+    EXPECT_EQ(options.simulation->packetsPerSecond, 50U);
+    EXPECT_EQ(options.recording, "");
+    EXPECT_EQ(ended({"service", "--simulate", "lte", "--play", "a"}).status, kExitWrongUsage);
+}
+
+TEST(Options, DemoBrowsesASimulatedModemOfLteUnlessAnotherIsNamed) {
+    const auto plain = parsed<BrowseOptions>({"demo"});
+    ASSERT_TRUE(plain.simulation);
+    EXPECT_EQ(plain.recording, std::nullopt);
+    EXPECT_EQ(plain.simulation->technology->commandName, "lte");
+    EXPECT_EQ(plain.simulation->seed, 1U);
+    EXPECT_EQ(plain.simulation->packetsPerSecond, 40U);
+    EXPECT_EQ(plain.simulation->duration, std::nullopt) << "it never ends";
+    const auto told =
+        parsed<BrowseOptions>({"demo", "gsm", "--seed", "7", "--speed", "max", "--seconds", "60",
+                               "--print", "--no-mouse", "--keep-going", "--log-level", "3"});
+    ASSERT_TRUE(told.simulation);
+    EXPECT_EQ(told.simulation->technology->commandName, "gsm");
+    EXPECT_EQ(told.simulation->seed, 7U);
+    EXPECT_EQ(told.simulation->duration, std::chrono::seconds(60));
+    EXPECT_EQ(told.play.speed, PlayOptions::kAsFastAsTaken);
+    EXPECT_TRUE(told.print);
+    EXPECT_FALSE(told.mouse);
+    EXPECT_TRUE(told.keepGoing);
+    EXPECT_EQ(told.logLevel, 3);
+}
+
+TEST(Options, SimulateWritesARecordingOfSomeSeconds) {
+    const auto options = parsed<SimulateOptions>(
+        {"simulate", "cdma", "--seconds", "5", "--seed", "9", "--rate", "20", "-o", "a.pcap"});
+    EXPECT_EQ(options.simulation.technology->commandName, "cdma");
+    EXPECT_EQ(options.simulation.duration, std::chrono::seconds(5));
+    EXPECT_EQ(options.simulation.seed, 9U);
+    EXPECT_EQ(options.simulation.packetsPerSecond, 20U);
+    EXPECT_EQ(options.file, "a.pcap");
+}
+
+TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
+    const auto sentence = [](std::vector<std::string> arguments) {
+        const ParseEnd end = ended(std::move(arguments));
+        EXPECT_EQ(end.status, kExitWrongUsage);
+        return end.text;
+    };
+    EXPECT_EQ(sentence({"demo", "wimax"}),
+              "pallax: technology: \"wimax\" is none of ifx|gsm|cdma|lte|utran (pallax --help "
+              "tells more)\n");
+    EXPECT_EQ(sentence({"demo", "--seconds", "0"}),
+              "pallax: --seconds: \"0\" is no whole number from 1 to 31622400 (pallax --help "
+              "tells more)\n");
+    EXPECT_EQ(sentence({"demo", "--rate", "x"}),
+              "pallax: --rate: \"x\" is no whole number from 1 to 1000000 (pallax --help tells "
+              "more)\n");
+    EXPECT_EQ(sentence({"simulate", "lte", "-o", "a"}),
+              "pallax: --seconds is required (pallax --help tells more)\n");
+    EXPECT_EQ(sentence({"service", "--seed", "3"}),
+              "pallax: --seed requires --simulate (pallax --help tells more)\n");
+}
+
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
-    for (const char* command : {"", "decode", "record", "service"}) {
+    for (const char* command : {"", "decode", "record", "service", "demo", "simulate"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);
@@ -168,7 +232,8 @@ TEST(Options, WrongUsageIsOneClearSentence) {
               "more)\n");
     EXPECT_EQ(wrongUsage({"decode"}), "pallax: RECORDING is required (pallax --help tells more)\n");
     EXPECT_EQ(wrongUsage({"service"}),
-              "pallax: the service needs --play, --relay or --status (pallax --help tells more)\n");
+              "pallax: the service needs --play, --simulate, --relay or --status (pallax --help "
+              "tells more)\n");
     EXPECT_EQ(wrongUsage({"a", "decode", "b"}),
               "pallax: the command \"decode\" must come first, without options before it (pallax "
               "--help tells more)\n");

@@ -1,0 +1,38 @@
+#pragma once
+
+#include "telephony/PacketPlayer.h"
+
+#include <CLI/CLI.hpp>
+
+#include <algorithm>
+#include <string>
+#include <utility>
+#include <vector>
+
+/// What several commands' options are made of.
+namespace pallax {
+
+/// Every choice goes by its name in the map, in the help and in the message about a wrong one.
+template <class Value>
+CLI::Option* addChoice(CLI::App& app, const std::string& name, Value& value,
+                       const std::vector<std::pair<std::string, Value>>& choices,
+                       const std::string& description) {
+    std::string names;
+    for (const auto& choice : choices) {
+        names += (names.empty() ? "" : "|") + choice.first;
+    }
+    const auto take = [name, &value, choices, names](const std::string& text) {
+        const auto found = std::find_if(choices.begin(), choices.end(),
+                                        [&](const auto& choice) { return choice.first == text; });
+        if (found == choices.end()) {
+            throw CLI::ValidationError(name, "\"" + text + "\" is none of " + names);
+        }
+        value = found->second;
+    };
+    return app.add_option_function<std::string>(name, take, description)->type_name(names);
+}
+
+/// --speed X|max.
+CLI::Option* addSpeed(CLI::App& app, PlayOptions& play);
+
+} // namespace pallax

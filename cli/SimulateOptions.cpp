@@ -1,0 +1,155 @@
+#include "cli/SimulateOptions.h"
+
+#include "cli/OptionParts.h"
+#include "host/Recording.h"
+
+#include <charconv>
+#include <cstdint>
+#include <limits>
+#include <string_view>
+
+namespace pallax {
+
+namespace {
+
+constexpr const char* kDemoFooter = R"(Examples:
+  pallax demo                          an LTE phone in a car
+  pallax demo lte --seed 7 --speed 4   another car, four times as fast
+  pallax demo --print --seconds 60 --speed max
+
+The same seed shows the same drive. Without --seconds it goes on until it is left.)";
+
+constexpr const char* kSimulateFooter = R"(Examples:
+  pallax simulate lte --seconds 3600 --rate 50 -o hour.pcap
+  pallax simulate lte --seconds 60 -o - | pallax decode -
+
+The same technology, seed, rate and duration give the same file. An existing file is replaced.)";
+
+/// A whole number within bounds; CLI11's own takes "-1" for a large one.
+template <class Value>
+Value numberOf(const char* option, const std::string& text, Value least, Value most) {
+    Value number{};
+    const char* end = text.data() + text.size();
+    const auto result = std::from_chars(text.data(), end, number);
+    if (result.ec != std::errc() || result.ptr != end || number < least || number > most) {
+        throw CLI::ValidationError(option, "\"" + text + "\" is no whole number from " +
+                                               std::to_string(least) + " to " +
+                                               std::to_string(most));
+    }
+    return number;
+}
+
+CLI::Option* addSeed(CLI::App& app, const std::function<void(std::uint64_t)>& take) {
+    return app
+        .add_option_function<std::string>(
+            "--seed",
+            [take](const std::string& text) {
+                take(numberOf<std::uint64_t>("--seed", text, 0,
+                                             std::numeric_limits<std::uint64_t>::max()));
+            },
+            "Which drive: the same number gives the same packets (default: 1)")
+        ->type_name("N");
+}
+
+CLI::Option* addRate(CLI::App& app, const std::function<void(unsigned)>& take) {
+    constexpr unsigned kMost = 1000000;
+    return app
+        .add_option_function<std::string>(
+            "--rate",
+            [take](const std::string& text) { take(numberOf("--rate", text, 1U, kMost)); },
+            "Packets a second (default: 40)")
+        ->type_name("N");
+}
+
+CLI::Option* addSeconds(CLI::App& app, SimulationOptions& simulation,
+                        const std::string& description) {
+    constexpr std::int64_t kMost = 366LL * 24 * 3600; // recordings have stamps until 2106
+    return app
+        .add_option_function<std::string>(
+            "--seconds",
+            [&simulation](const std::string& text) {
+                simulation.duration =
+                    std::chrono::seconds(numberOf<std::int64_t>("--seconds", text, 1, kMost));
+            },
+            description)
+        ->type_name("N");
+}
+
+CLI::Option* addTechnology(CLI::App& app, const std::string& name,
+                           const std::function<void(const RecordedTechnology*)>& take,
+                           const std::string& description) {
+    std::string names;
+    for (const RecordedTechnology* each : simulatedTechnologies()) {
+        names += names.empty() ? "" : "|";
+        names += each->commandName;
+    }
+    return app
+        .add_option_function<std::string>(
+            name,
+            [take, names](const std::string& text) {
+                for (const RecordedTechnology* each : simulatedTechnologies()) {
+                    if (each->commandName == text) {
+                        return take(each);
+                    }
+                }
+                throw CLI::ValidationError("technology", "\"" + text + "\" is none of " + names);
+            },
+            description)
+        ->type_name(names);
+}
+
+void addCommon(CLI::App& app, SimulationOptions& simulation) {
+    addSeed(app, [&simulation](std::uint64_t seed) { simulation.seed = seed; });
+    addRate(app, [&simulation](unsigned rate) { simulation.packetsPerSecond = rate; });
+}
+
+} // namespace
+
+const RecordedTechnology* usualSimulatedTechnology() {
+    return technologyOfCommandName("lte");
+}
+
+void addDemo(CLI::App& app, SimulationOptions& simulation, PlayOptions& play) {
+    simulation.technology = usualSimulatedTechnology();
+    addTechnology(
+        app, "TECHNOLOGY",
+        [&simulation](const RecordedTechnology* technology) { simulation.technology = technology; },
+        "What the simulated modem speaks (default: lte)");
+    addCommon(app, simulation);
+    addSeconds(app, simulation, "End after so many simulated seconds (default: never)");
+    addSpeed(app, play);
+    app.footer(kDemoFooter);
+}
+
+void addSimulate(CLI::App& app, SimulateOptions& options) {
+    addTechnology(
+        app, "TECHNOLOGY",
+        [&options](const RecordedTechnology* technology) {
+            options.simulation.technology = technology;
+        },
+        "What the simulated modem speaks")
+        ->required();
+    addSeconds(app, options.simulation, "How much time the recording covers")->required();
+    addCommon(app, options.simulation);
+    app.add_option("-o,--output", options.file, "Where to; - is standard output")
+        ->required()
+        ->type_name("FILE");
+    app.footer(kSimulateFooter);
+}
+
+CLI::Option* addServiceSimulation(CLI::App& app, std::optional<SimulationOptions>& simulation) {
+    CLI::Option* technology = addTechnology(
+        app, "--simulate",
+        [&simulation](const RecordedTechnology* named) {
+            simulation.emplace(simulation.value_or(SimulationOptions{})).technology = named;
+        },
+        "The modem to simulate for each viewer");
+    const auto chosen = [&simulation]() -> SimulationOptions& {
+        return simulation ? *simulation : simulation.emplace();
+    };
+    addSeed(app, [chosen](std::uint64_t seed) { chosen().seed = seed; })->needs(technology);
+    addRate(app, [chosen](unsigned rate) { chosen().packetsPerSecond = rate; })->needs(technology);
+    return technology;
+}
+
+} // namespace pallax

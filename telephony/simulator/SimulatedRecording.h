@@ -1,0 +1,16 @@
+#pragma once
+
+#include "host/HostError.h"
+#include "telephony/simulator/Simulation.h"
+
+#include <optional>
+#include <string>
+
+namespace pallax {
+
+/// Writes a simulation with a duration as a recording to `path` ("-" is standard output), where
+/// an existing file is replaced. The sentence that tells why not, if it could not.
+std::optional<HostError> writeSimulatedRecording(const SimulationOptions& options,
+                                                 const std::string& path);
+
+} // namespace pallax

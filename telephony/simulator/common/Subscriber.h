@@ -1,0 +1,20 @@
+#pragma once
+
+#include "platform/PropertyList.h"
+
+#include <string_view>
+
+/// The subscriber of every simulated phone, of network 262 42.
+namespace pallax {
+
+inline constexpr unsigned kHomeCountry = 262;
+inline constexpr unsigned kHomeNetwork = 42;
+
+/// The SIM's files. `mode` is what the phone prefers: "LTE preferred".
+PropertyList simFiles(std::string_view mode, unsigned area);
+
+/// The packet-data contexts: one that is always there, and, during a session, another one.
+/// `standing` is its access point name.
+PropertyList pdpContexts(std::string_view standing, bool session);
+
+} // namespace pallax

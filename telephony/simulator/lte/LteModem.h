@@ -1,0 +1,29 @@
+#pragma once
+
+#include "telephony/simulator/Modem.h"
+#include "telephony/simulator/ReportMix.h"
+
+#include <memory>
+
+namespace pallax {
+
+/// The LTE modem: measurements of the serving carrier in idle and in connected mode, and in idle
+/// mode candidates on other carriers and of other technologies.
+class LteModem final : public Modem {
+public:
+    static ScenarioPlan plan();
+
+    void observe(const Scenario& scenario, RecordQueue& queue) override;
+    void report(const Scenario& scenario, Random& random, ByteBuffer& out) override;
+
+private:
+    enum Kind { kServing, kNeighbours, kCandidates, kConnected, kMonitor, kKindCount };
+    void reportCandidates(const Scenario& scenario, ByteBuffer& out);
+    void reportCellMonitor(const Scenario& scenario, ByteBuffer& out);
+
+    ReportMix<kKindCount> _mix;
+    unsigned _candidateTurn = 0;
+    unsigned _monitorTurn = 0;
+};
+
+} // namespace pallax

@@ -1,0 +1,132 @@
+#include "tests/telephony/simulator/SimulatedPhone.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstdlib>
+#include <set>
+
+namespace pallax {
+namespace {
+
+using std::chrono::seconds;
+
+constexpr std::uint64_t kSeeds = 100;
+constexpr std::string_view kInfo = "Serving Cell Info";
+constexpr std::string_view kIdle = "Serving Cell Measurements";
+constexpr std::string_view kConnected = "Connected mode LTE Intra-frequency Measurement";
+
+std::uint32_t codeOf(Bytes message) {
+    return LogPacketGetLogCode(LogRecord(LogPacketStripPrefix(message)));
+}
+
+double numberIn(const std::string& text) {
+    return std::strtod(text.c_str(), nullptr);
+}
+
+/// What holds after each packet of any drive.
+void expectConsistent(const DecodedDisplay& decoded, std::uint32_t code) {
+    const std::string serving = decoded.text(kInfo, "Physical Cell ID");
+    std::vector<std::string> neighbours;
+    if (code == 0xB17F) {
+        EXPECT_EQ(decoded.text(kIdle, "Physical Cell ID"), serving);
+        EXPECT_EQ(decoded.text(kIdle, "E-ARFCN"), decoded.text(kInfo, "Download Frequency"));
+    } else if (code == 0xB179) {
+        EXPECT_EQ(decoded.text(kConnected, "Serving Physical Cell ID"), serving);
+        neighbours = decoded.texts("Measured Neighbor Cells", "Physical Cell ID");
+        const auto detected = decoded.texts("Detected Cells", "Physical Cell ID");
+        neighbours.insert(neighbours.end(), detected.begin(), detected.end());
+    } else if (code == 0xB180) {
+        neighbours = decoded.texts("Neighbor Cells List", "Physical Cell ID");
+        EXPECT_FALSE(neighbours.empty());
+    } else if (code == 0xB186) {
+        EXPECT_EQ(decoded.text("Reselection Candidates", "Serving Cell ID"), serving);
+    }
+    EXPECT_EQ(std::count(neighbours.begin(), neighbours.end(), serving), 0)
+        << "the serving cell is its own neighbour";
+    EXPECT_EQ(std::set<std::string>(neighbours.begin(), neighbours.end()).size(), neighbours.size())
+        << "a neighbour comes twice";
+}
+
+TEST(LteSimulation, TheRecordsAgreeAboutTheServingCellAndItsNeighbours) {
+    for (std::uint64_t seed = 0; seed < kSeeds && !testing::Test::HasFailure(); ++seed) {
+        SCOPED_TRACE("seed " + std::to_string(seed));
+        DecodedDisplay decoded("lte");
+        SimulationOptions options = simulationOf("lte", seed, seconds(60));
+        options.packetsPerSecond = 5;
+        Simulation simulation(options);
+        while (const auto packet = simulation.next()) {
+            const std::string before = decoded.text(kInfo, "Physical Cell ID");
+            const std::string identity = decoded.text(kInfo, "Cell Identity");
+            decoded.feed(packet->data);
+            const std::uint32_t code = codeOf(packet->data);
+            expectConsistent(decoded, code);
+            if (code == 0xFF0001) { // tells the same as the identity record before it
+                EXPECT_EQ(decoded.text(kInfo, "Physical Cell ID"), before);
+                EXPECT_EQ(decoded.text(kInfo, "Cell Identity"), identity);
+            }
+        }
+    }
+}
+
+TEST(LteSimulation, LevelsAreInRangeAndMoveSmoothlyWhileOneCellServes) {
+    // A step of 200 ms at 17 m/s, with shadowing and noise at their bounds.
+    constexpr double kLargestStep_db = 5;
+    for (std::uint64_t seed = 0; seed < kSeeds && !testing::Test::HasFailure(); ++seed) {
+        SCOPED_TRACE("seed " + std::to_string(seed));
+        DecodedDisplay decoded("lte");
+        SimulationOptions options = simulationOf("lte", seed, seconds(30));
+        options.packetsPerSecond = 10;
+        Simulation simulation(options);
+        std::string cell;
+        double last_dbm = 0;
+        Time lastTime = Simulation::kStart;
+        while (const auto packet = simulation.next()) {
+            decoded.feed(packet->data);
+            const std::uint32_t code = codeOf(packet->data);
+            if (code != 0xB17F && code != 0xB179) {
+                continue;
+            }
+            const double level_dbm =
+                numberIn(code == 0xB17F ? decoded.text(kIdle, "Measured RSRP")
+                                        : decoded.text(kConnected, "Serving Filtered RSRP"));
+            const double quality_db =
+                numberIn(code == 0xB17F ? decoded.text(kIdle, "Measured RSRQ")
+                                        : decoded.text(kConnected, "Serving Filtered RSRQ"));
+            EXPECT_TRUE(level_dbm >= -125 && level_dbm <= -40) << level_dbm;
+            EXPECT_TRUE(quality_db >= -20 && quality_db <= -3) << quality_db;
+            const std::string serving = decoded.text(kInfo, "Physical Cell ID");
+            if (serving == cell && packet->time - lastTime < Scenario::kStep) {
+                EXPECT_LE(std::abs(level_dbm - last_dbm), kLargestStep_db);
+            }
+            cell = serving;
+            last_dbm = level_dbm;
+            lastTime = packet->time;
+        }
+    }
+}
+
+TEST(LteSimulation, InTenMinutesThePhoneVisitsManyCellsAndCandidatesOfEveryTechnology) {
+    DecodedDisplay decoded("lte");
+    SimulationOptions options = simulationOf("lte", 5, seconds(600));
+    options.packetsPerSecond = 5;
+    Simulation simulation(options);
+    std::set<std::string> cells;
+    std::set<std::string> technologies;
+    std::set<std::string> areas;
+    while (const auto packet = simulation.next()) {
+        decoded.feed(packet->data);
+        cells.insert(decoded.text(kInfo, "Physical Cell ID"));
+        areas.insert(decoded.text(kInfo, "Tracking Area Code"));
+        for (const std::string& each :
+             decoded.texts("Reselection Candidates List", "Candidate RAT Type")) {
+            technologies.insert(each);
+        }
+    }
+    EXPECT_GE(cells.size(), 6U);
+    EXPECT_GE(areas.size(), 3U) << "of four, and absent at first";
+    EXPECT_EQ(technologies,
+              (std::set<std::string>{"LTE", "UTRAN", "GERAN", "CDMA1XRTT", "CDMAHRPD"}));
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,34 @@
+#pragma once
+
+#include "tests/telephony/simulator/SimulatedPhone.h"
+
+#include <rapidcheck.h>
+
+#include <string>
+
+/// Random values that an encoder takes, and how a display tells them.
+namespace pallax {
+
+inline unsigned below(unsigned bound) {
+    return *rc::gen::inRange(0U, bound);
+}
+inline int between(int least, int bound) {
+    return *rc::gen::inRange(least, bound);
+}
+/// A level on the grid of a record: `least` plus a number of steps.
+inline double onGrid(double least, double step, unsigned count) {
+    return least + step * below(count);
+}
+inline std::string text(unsigned number) {
+    return std::to_string(number);
+}
+
+/// The display of that technology after the record of `value`.
+template <class Value>
+void feedEncoded(DecodedDisplay& decoded, const Value& value) {
+    ByteBuffer bytes;
+    encode(value, bytes); // found in the namespace of the value
+    decoded.feed(bytes);
+}
+
+} // namespace pallax
