@@ -289,7 +289,9 @@ TEST_F(PallaxPaneControllerTest, SelectingABranchPushesAPaneWithTheBranchsNameAn
 TEST_F(PallaxPaneControllerTest, APushedPanesPathIsTheChildsKeyInThePathDictionary) {
     PathDictionary paths;
     const NodeRef root = PallaxModelNode::makeTreeFromObject(
-        Dictionary{{"a/b", Dictionary{{"_sorted", "1"}, {"1;x", Array{Array{"leaf"}}}}}}, paths);
+        Dictionary{
+            {"a/b", Dictionary{{"_sorted", "1"}, {"1;x", Array{PropertyList(Array{"leaf"})}}}}},
+        paths);
     putOnStack(makePane(root, "/"));
     for (const char* path : {"/a/b", "/a/b/x", "/a/b/x/0"}) {
         auto& pane = dynamic_cast<PallaxPaneController&>(application.stack->top());

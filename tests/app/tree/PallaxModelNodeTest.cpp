@@ -287,7 +287,8 @@ TEST(PallaxModelNodeDeathTest, TheArrayLockIsHeldWhileAnArrayIsWalkedAndNotForDi
 TEST(PallaxModelNode, TheDepthOfTheArrayLockIsBackAfterNestedArrays) {
     const auto depth = ArrayLock::depth();
     PathDictionary paths;
-    EXPECT_EQ(shown(PallaxModelNode::makeTreeFromObject(Array{Array{Array{"x"}}, "y"}, paths)),
+    EXPECT_EQ(shown(PallaxModelNode::makeTreeFromObject(Array{Array{PropertyList(Array{"x"})}, "y"},
+                                                        paths)),
               "Pallax(0(0(0=x)) 1=y)");
     EXPECT_EQ(ArrayLock::depth(), depth);
 }
