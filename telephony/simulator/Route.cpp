@@ -9,8 +9,8 @@ namespace pallax {
 namespace {
 
 constexpr int kCorners = 14;
-constexpr double kNearest_m = 1100;
-constexpr double kFarthest_m = 1700;
+constexpr double kNearestM = 1100;
+constexpr double kFarthestM = 1700;
 // One fourteenth of a turn, as numbers, for sines differ between machines in the last bit.
 constexpr double kTurnCosine = 0.9009688679024191;
 constexpr double kTurnSine = 0.4338837391175581;
@@ -21,7 +21,7 @@ struct Hill {
 };
 constexpr std::array<Hill, 3> kHills = {{{330, 260}, {2900, 420}, {5600, 300}}};
 /// Over so many metres the shadow comes and goes.
-constexpr double kSlope_m = 60;
+constexpr double kSlopeM = 60;
 
 double distance(const PlanePoint& a, const PlanePoint& b) {
     return std::sqrt((a.x_m - b.x_m) * (a.x_m - b.x_m) + (a.y_m - b.y_m) * (a.y_m - b.y_m));
@@ -32,7 +32,7 @@ double distance(const PlanePoint& a, const PlanePoint& b) {
 Route::Route(Random& random) {
     PlanePoint direction{1, 0};
     for (int corner = 0; corner < kCorners; ++corner) {
-        const double radius_m = random.between(kNearest_m, kFarthest_m);
+        const double radius_m = random.between(kNearestM, kFarthestM);
         _corners.push_back({direction.x_m * radius_m, direction.y_m * radius_m});
         direction = {direction.x_m * kTurnCosine - direction.y_m * kTurnSine,
                      direction.x_m * kTurnSine + direction.y_m * kTurnCosine};
@@ -65,7 +65,7 @@ double Route::shadowAt(double distance_m) const {
     for (const Hill& hill : kHills) {
         const double inside_m =
             std::min(place_m - hill.start_m, hill.start_m + hill.length_m - place_m);
-        shadow = std::max(shadow, std::clamp(inside_m / kSlope_m, 0.0, 1.0));
+        shadow = std::max(shadow, std::clamp(inside_m / kSlopeM, 0.0, 1.0));
     }
     return shadow;
 }

@@ -6,8 +6,8 @@ namespace pallax {
 
 namespace {
 
-constexpr double kSlowest_mps = 7;
-constexpr double kFastest_mps = 17;
+constexpr double kSlowestMps = 7;
+constexpr double kFastestMps = 17;
 
 } // namespace
 
@@ -33,10 +33,10 @@ void Scenario::step() {
 }
 
 void Scenario::move() {
-    constexpr double kSpeedChange_mps = 0.25; // in one step
+    constexpr double kSpeedChangeMps = 0.25; // in one step
     constexpr double kStep_s = std::chrono::duration<double>(kStep).count();
     _speed_mps =
-        std::clamp(_speed_mps + _random.normal() * kSpeedChange_mps, kSlowest_mps, kFastest_mps);
+        std::clamp(_speed_mps + _random.normal() * kSpeedChangeMps, kSlowestMps, kFastestMps);
     const double moved_m = _speed_mps * kStep_s;
     _distance_m += moved_m;
     const PlanePoint phone = _route.at(_distance_m);

@@ -16,8 +16,8 @@ using Phase = Activity::Phase;
 
 enum Layer : std::size_t { k1x, kEvdoLayer, kLayerCount };
 
-constexpr double kNoise_db = 0.4;
-constexpr double kLeastPart_db = -15;
+constexpr double kNoiseDb = 0.4;
+constexpr double kLeastPartDb = -15;
 constexpr std::size_t kMostPilots = 4;
 
 /// The serving pilot and others that are strong enough, with their parts of what is received.
@@ -28,8 +28,8 @@ struct PilotSet {
     PilotSet(const RadioLayer& layer, double load, Random& random) {
         add(layer, layer.camped(), load, random);
         for (const std::size_t index : layer.neighbours()) {
-            constexpr double kAddThreshold_db = -11;
-            if (layer.level_dbm(index) - layer.total_dbm() > kAddThreshold_db &&
+            constexpr double kAddThresholdDb = -11;
+            if (layer.level_dbm(index) - layer.total_dbm() > kAddThresholdDb &&
                 count < kMostPilots) {
                 add(layer, index, load, random);
             }
@@ -39,27 +39,27 @@ struct PilotSet {
 
 private:
     void add(const RadioLayer& layer, std::size_t index, double load, Random& random) {
-        constexpr double kAlone_db = -1.5;
-        constexpr double kLoad_db = -3;
+        constexpr double kAloneDb = -1.5;
+        constexpr double kLoadDb = -3;
         const double part_db =
-            layer.level_dbm(index) - layer.total_dbm() + kAlone_db + kLoad_db * load;
+            layer.level_dbm(index) - layer.total_dbm() + kAloneDb + kLoadDb * load;
         pilots[count++] = {layer.cells()[index].code,
-                           std::clamp(measured(part_db, kNoise_db, random), kLeastPart_db, -0.5)};
+                           std::clamp(measured(part_db, kNoiseDb, random), kLeastPartDb, -0.5)};
     }
 };
 
 /// All that is received of a carrier is stronger than its pilots.
 double received_dbm(const RadioLayer& layer, Random& random) {
-    constexpr double kAbovePilots_db = 4;
-    return measured(layer.total_dbm() + kAbovePilots_db, kNoise_db, random);
+    constexpr double kAbovePilotsDb = 4;
+    return measured(layer.total_dbm() + kAbovePilotsDb, kNoiseDb, random);
 }
 
 /// By open-loop power control: the weaker the cell, the louder the phone.
 double transmit_dbm(double receive_dbm) {
-    constexpr double kSumOfBoth_dbm = -76;
-    constexpr double kLeast_dbm = -50;
-    constexpr double kMost_dbm = 23;
-    return std::clamp(kSumOfBoth_dbm - receive_dbm, kLeast_dbm, kMost_dbm);
+    constexpr double kSumOfBothDbm = -76;
+    constexpr double kLeastDbm = -50;
+    constexpr double kMostDbm = 23;
+    return std::clamp(kSumOfBothDbm - receive_dbm, kLeastDbm, kMostDbm);
 }
 
 void encodeIdentity(const Scenario& scenario, ByteBuffer& out) {
@@ -170,7 +170,7 @@ void CdmaModem::report(const Scenario& scenario, Random& random, ByteBuffer& out
 
 void CdmaModem::reportOneX(const Scenario& scenario, Random& random, ByteBuffer& out) {
     constexpr unsigned kPagingEvery = 5;
-    constexpr double kSecondLower_db = 1.5;
+    constexpr double kSecondLowerDb = 1.5;
     const RadioLayer& layer = scenario.layer(k1x);
     const auto state = [&] {
         switch (scenario.activity().phase()) {
@@ -190,13 +190,13 @@ void CdmaModem::reportOneX(const Scenario& scenario, Random& random, ByteBuffer&
     const double level_dbm = received_dbm(layer, random);
     const PilotSet pilots(layer, isCall(scenario) ? scenario.activity().load() : 0, random);
     cdma::encode(cdma::OneXStatus{state, 0, layer.campedCell().channel, level_dbm,
-                                  level_dbm - kSecondLower_db, transmit_dbm(level_dbm),
+                                  level_dbm - kSecondLowerDb, transmit_dbm(level_dbm),
                                   pilots.all()},
                  out);
 }
 
 void CdmaModem::reportEvdo(const Scenario& scenario, Random& random, ByteBuffer& out) {
-    constexpr double kSecondLower_db = 2;
+    constexpr double kSecondLowerDb = 2;
     constexpr std::uint32_t kUati = 0x0A42F7;
     constexpr unsigned kColorCode = 63;
     const Phase phase = scenario.activity().phase();
@@ -207,12 +207,10 @@ void CdmaModem::reportEvdo(const Scenario& scenario, Random& random, ByteBuffer&
         state = EvdoState::Inactive;
     } else if (phase == Phase::Searching) {
         state = EvdoState::Acquisition;
-    } else if (phase == Phase::Registering) {
+    } else if (phase == Phase::Registering || (phase == Phase::Connecting && _sessions % 2 == 1)) {
         state = EvdoState::Access;
     } else if (isData(scenario)) {
         state = EvdoState::Connected;
-    } else if (phase == Phase::Connecting && _sessions % 2 == 1) {
-        state = EvdoState::Access;
     }
     const EvdoSession session = registered                    ? EvdoSession::Open
                                 : phase == Phase::Registering ? EvdoSession::PhoneNegotiates
@@ -220,8 +218,7 @@ void CdmaModem::reportEvdo(const Scenario& scenario, Random& random, ByteBuffer&
     const double level_dbm = received_dbm(layer, random);
     const bool hears = state >= EvdoState::Sync;
     cdma::encode(cdma::EvdoStatus{layer.campedCell().channel, 0, whole(level_dbm),
-                                  whole(level_dbm - kSecondLower_db),
-                                  whole(transmit_dbm(level_dbm)),
+                                  whole(level_dbm - kSecondLowerDb), whole(transmit_dbm(level_dbm)),
                                   hears ? layer.campedCell().code : cdma::EvdoStatus::kNoPn, state,
                                   session, registered ? kUati : 0, kColorCode},
                  out);

@@ -24,9 +24,9 @@ RecordWriter& subpacket(RecordWriter& record, unsigned number, std::size_t size)
 
 /// In steps of 0.334 dB above -63.248 dBm.
 int rawGain(double level_dbm) {
-    constexpr double kMiddle_dbm = -63.248;
-    constexpr double kStep_db = 0.334;
-    return std::clamp(whole((level_dbm - kMiddle_dbm) / kStep_db), -128, 127);
+    constexpr double kMiddleDbm = -63.248;
+    constexpr double kStepDb = 0.334;
+    return std::clamp(whole((level_dbm - kMiddleDbm) / kStepDb), -128, 127);
 }
 
 // The scale of the energies of the active set: 2^(2e - 3) E / (9 N^2 g) - 1/N is the part.

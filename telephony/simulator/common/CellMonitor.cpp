@@ -20,10 +20,10 @@ cellMonitorEntry(std::string_view technology, CellRole role,
 }
 
 PropertyList gsmNeighbourEntry(const Cell& cell, double level_dbm) {
-    constexpr double kStep_db = 2; // of a cell-monitor level of GSM
+    constexpr double kStepDb = 2; // of a cell-monitor level of GSM
     return cellMonitorEntry(
         kHXCellMonitorRadioAccessTechnologyGSM, CellRole::Neighbour,
-        {{kHXCellMonitorARFCN, cell.channel}, {kHXCellMonitorRSSI, whole(level_dbm / kStep_db)}});
+        {{kHXCellMonitorARFCN, cell.channel}, {kHXCellMonitorRSSI, whole(level_dbm / kStepDb)}});
 }
 
 } // namespace pallax

@@ -11,8 +11,8 @@ namespace pallax::gsm {
 
 namespace {
 
-constexpr double kNoise_db = 0.7;
-constexpr int kLeastAccess_dbm = -105;
+constexpr double kNoiseDb = 0.7;
+constexpr int kLeastAccessDbm = -105;
 constexpr std::size_t kMostNeighbours = 6;
 
 std::span<const std::size_t> neighboursOf(const Scenario& scenario) {
@@ -21,25 +21,24 @@ std::span<const std::size_t> neighboursOf(const Scenario& scenario) {
 }
 
 int levelOf(const RadioLayer& layer, std::size_t cell, Random& random) {
-    return whole(measured(layer.level_dbm(cell), kNoise_db, random));
+    return whole(measured(layer.level_dbm(cell), kNoiseDb, random));
 }
 
 } // namespace
 
 void reportMeasurement(const Scenario& scenario, Random& random, ByteBuffer& out) {
-    constexpr int kReselectOffset_db = 6;
+    constexpr int kReselectOffsetDb = 6;
     const RadioLayer& layer = scenario.layer(GsmModem::kGsm);
     std::array<NeighbourLevel, kMostNeighbours> cells{};
     std::size_t count = 0;
     for (const std::size_t index : neighboursOf(scenario)) {
         const int level_dbm = levelOf(layer, index, random);
-        cells[count++] = {layer.cells()[index].channel, level_dbm, level_dbm - kLeastAccess_dbm};
+        cells[count++] = {layer.cells()[index].channel, level_dbm, level_dbm - kLeastAccessDbm};
     }
     const int level_dbm = levelOf(layer, layer.camped(), random);
-    const int c1 = std::max(level_dbm - kLeastAccess_dbm, 0);
-    encode(
-        Measurement{level_dbm, c1, c1 + kReselectOffset_db, true, std::span(cells.data(), count)},
-        out);
+    const int c1 = std::max(level_dbm - kLeastAccessDbm, 0);
+    encode(Measurement{level_dbm, c1, c1 + kReselectOffsetDb, true, std::span(cells.data(), count)},
+           out);
 }
 
 void reportBsics(const Scenario& scenario, ByteBuffer& out) {
@@ -59,7 +58,7 @@ void reportGsmRanking(const Scenario& scenario, Random& random, ByteBuffer& out)
     const auto add = [&](std::size_t index) {
         const Cell& cell = layer.cells()[index];
         const int level_dbm = levelOf(layer, index, random);
-        cells[count++] = {cell.channel, cell.code, level_dbm, level_dbm - kLeastAccess_dbm};
+        cells[count++] = {cell.channel, cell.code, level_dbm, level_dbm - kLeastAccessDbm};
     };
     add(layer.camped());
     for (const std::size_t index : neighboursOf(scenario)) {

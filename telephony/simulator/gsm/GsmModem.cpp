@@ -54,23 +54,23 @@ void GsmModem::observe(const Scenario& scenario, RecordQueue& queue) {
 
 void GsmModem::report(const Scenario& scenario, Random& random, ByteBuffer& out) {
     ReportMix<kKindCount>::Shares shares{};
-    shares[kMonitor] = 2;
-    shares[kNetwork] = 4;
+    shares[kMonitor] = 1;
+    shares[kNetwork] = 8;
     if (scenario.servingLayer() == kGsm) {
-        shares[kMeasurement] = 40;
-        shares[kBsics] = 12;
-        shares[kDtx] = 3;
-        shares[kSearcher] = 6; // for the way back
+        shares[kMeasurement] = 80;
+        shares[kBsics] = 24;
+        shares[kDtx] = 6;
+        shares[kSearcher] = 12; // for the way back
     } else if (scenario.activity().isConnected()) {
-        shares[kSearcher] = 26;
-        shares[kPower] = 22;
-        shares[kHsdpa] = 18;
-        shares[kBlocks] = 8;
+        shares[kSearcher] = 52;
+        shares[kPower] = 44;
+        shares[kHsdpa] = 36;
+        shares[kBlocks] = 16;
     } else {
         // Either ranking empties the other set; the GSM one comes at times.
-        shares[kSearcher] = 26;
-        shares[kUmtsRanking] = 20;
-        shares[kGsmRanking] = 4;
+        shares[kSearcher] = 52;
+        shares[kUmtsRanking] = 40;
+        shares[kGsmRanking] = 8;
     }
     switch (_mix.next(shares)) {
     case kSearcher:
@@ -155,8 +155,8 @@ void GsmModem::reportCellMonitor(const Scenario& scenario, ByteBuffer& out) {
         const Cell& cell = umts.cells()[index];
         const double level_dbm = umts.level_dbm(index);
         const double ecno = gsm::ecno_db(scenario, level_dbm);
-        constexpr double kLeastEcno_db = -20;
-        if (ecno > kLeastEcno_db) {
+        constexpr double kLeastEcnoDb = -20;
+        if (ecno > kLeastEcnoDb) {
             cells.push_back(cellMonitorEntry(kHXCellMonitorRadioAccessTechnologyUMTS,
                                              CellRole::Neighbour,
                                              {{kHXCellMonitorUARFCN, cell.channel},

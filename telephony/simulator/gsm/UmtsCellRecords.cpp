@@ -38,7 +38,7 @@ constexpr int kAgcOffset = 512;
 //   16         120    each cell: byte 7 scrambling code (13 bits), set (3 bits)
 //   16 + 15N   352    each cell: eleven words, of which the ninth is its energy
 void encode(const Searcher& searcher, ByteBuffer& out) {
-    constexpr int kLeastCarrier_dbm = -106;
+    constexpr int kLeastCarrierDbm = -106;
     constexpr unsigned kMonitored = 1;
     constexpr unsigned kSetShift = 13;
     constexpr std::size_t kBeforeCode = 7;
@@ -46,7 +46,7 @@ void encode(const Searcher& searcher, ByteBuffer& out) {
     constexpr std::size_t kBeforeEnergy = 32;
     constexpr std::size_t kAfterEnergy = 8;
     RecordWriter record(out, 0x417A);
-    record.s16((searcher.carrier_dbm - kLeastCarrier_dbm) * kTenths - kAgcOffset);
+    record.s16((searcher.carrier_dbm - kLeastCarrierDbm) * kTenths - kAgcOffset);
     record.u8(static_cast<unsigned>(searcher.cells.size()));
     for (const SearchedCell& cell : searcher.cells) {
         record.skip(kBeforeCode);
@@ -65,13 +65,13 @@ void encode(const Searcher& searcher, ByteBuffer& out) {
 //                Ec/No in halves of a dB (8), ranking value (16)
 void encode(std::span<const RankedUmtsCell> ranking, ByteBuffer& out) {
     constexpr int kRscpOffset = 21;
-    constexpr double kStep_db = 0.5;
+    constexpr double kStepDb = 0.5;
     RecordWriter record(out, 0x4005);
     record.u8(static_cast<unsigned>(ranking.size())).u8(0);
     for (const RankedUmtsCell& cell : ranking) {
         record.u16(cell.uarfcn).u16(cell.scramblingCode);
         record.s8(cell.rscp_dbm + kRscpOffset).s16(cell.rscp_dbm);
-        record.s8(static_cast<int>(cell.ecno_db / kStep_db)).s16(cell.rank);
+        record.s8(static_cast<int>(cell.ecno_db / kStepDb)).s16(cell.rank);
     }
 }
 

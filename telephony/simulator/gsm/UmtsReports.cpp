@@ -11,8 +11,8 @@ namespace pallax::gsm {
 
 namespace {
 
-constexpr double kNoise_db = 0.6;
-constexpr double kLeastEcno_db = -20;
+constexpr double kNoiseDb = 0.6;
+constexpr double kLeastEcnoDb = -20;
 constexpr std::size_t kMostCells = 6;
 
 /// Ec/No of the cells that the searcher finds, the serving one first.
@@ -25,7 +25,7 @@ void visitCells(const Scenario& scenario, Visit visit) {
     visit(layer.camped());
     std::size_t count = 1;
     for (const std::size_t index : layer.neighbours()) {
-        if (count++ < kMostCells && ecno_db(scenario, layer.level_dbm(index)) > kLeastEcno_db) {
+        if (count++ < kMostCells && ecno_db(scenario, layer.level_dbm(index)) > kLeastEcnoDb) {
             visit(index);
         }
     }
@@ -35,9 +35,9 @@ void visitCells(const Scenario& scenario, Visit visit) {
 double blockErrorRate(const Scenario& scenario) {
     const RadioLayer& layer = scenario.layer(GsmModem::kUmts);
     const double ecno = ecno_db(scenario, layer.campedLevel_dbm());
-    constexpr double kGood_db = -5;
+    constexpr double kGoodDb = -5;
     constexpr double kRatePerDb = 0.012;
-    return std::clamp((kGood_db - ecno) * kRatePerDb, 0.005, 0.3);
+    return std::clamp((kGoodDb - ecno) * kRatePerDb, 0.005, 0.3);
 }
 
 std::uint32_t errorsOf(std::uint32_t blocks, const Scenario& scenario, Random& random) {
@@ -49,10 +49,10 @@ std::uint32_t errorsOf(std::uint32_t blocks, const Scenario& scenario, Random& r
 } // namespace
 
 double ecno_db(const Scenario& scenario, double level_dbm) {
-    constexpr double kAlone_db = -3;
-    constexpr double kLoad_db = -3;
-    return level_dbm - scenario.layer(GsmModem::kUmts).total_dbm() + kAlone_db +
-           kLoad_db * scenario.activity().load();
+    constexpr double kAloneDb = -3;
+    constexpr double kLoadDb = -3;
+    return level_dbm - scenario.layer(GsmModem::kUmts).total_dbm() + kAloneDb +
+           kLoadDb * scenario.activity().load();
 }
 
 void reportSearcher(const Scenario& scenario, Random& random, ByteBuffer& out) {
@@ -63,38 +63,38 @@ void reportSearcher(const Scenario& scenario, Random& random, ByteBuffer& out) {
     visitCells(scenario, [&](std::size_t index) {
         const double ecno = ecno_db(scenario, layer.level_dbm(index));
         cells[count++] = {layer.cells()[index].code, index == layer.camped(),
-                          std::clamp(whole(measured(ecno, kNoise_db, random)), -22, -1)};
+                          std::clamp(whole(measured(ecno, kNoiseDb, random)), -22, -1)};
     });
     encode(Searcher{whole(carrier_dbm), std::span(cells.data(), count)}, out);
 }
 
 void reportUmtsRanking(const Scenario& scenario, Random& random, ByteBuffer& out) {
-    constexpr int kLeastRank_dbm = -115;
+    constexpr int kLeastRankDbm = -115;
     const RadioLayer& layer = scenario.layer(GsmModem::kUmts);
     std::array<RankedUmtsCell, kMostCells> cells{};
     std::size_t count = 0;
     visitCells(scenario, [&](std::size_t index) {
         const Cell& cell = layer.cells()[index];
-        const int rscp = whole(measured(layer.level_dbm(index), kNoise_db, random));
-        const double ecno = measured(ecno_db(scenario, layer.level_dbm(index)), kNoise_db, random);
+        const int rscp = whole(measured(layer.level_dbm(index), kNoiseDb, random));
+        const double ecno = measured(ecno_db(scenario, layer.level_dbm(index)), kNoiseDb, random);
         cells[count++] = {cell.channel, cell.code, rscp, whole(2 * std::min(ecno, -0.5)) / 2.0,
-                          rscp - kLeastRank_dbm};
+                          rscp - kLeastRankDbm};
     });
     encode(std::span<const RankedUmtsCell>(cells.data(), count), out);
 }
 
 void reportTransmitPower(const Scenario& scenario, Random& random, ByteBuffer& out) {
     // The weaker the cell is heard, the louder the phone is: by open-loop power control.
-    constexpr double kSumOfBoth_dbm = -88;
-    constexpr double kLargest_dbm = 23;
-    constexpr double kLeast_dbm = -50;
+    constexpr double kSumOfBothDbm = -88;
+    constexpr double kLargestDbm = 23;
+    constexpr double kLeastDbm = -50;
     const double power_dbm =
-        std::clamp(kSumOfBoth_dbm - scenario.layer(GsmModem::kUmts).campedLevel_dbm() +
+        std::clamp(kSumOfBothDbm - scenario.layer(GsmModem::kUmts).campedLevel_dbm() +
                        scenario.activity().load() * 6,
-                   kLeast_dbm, kLargest_dbm);
+                   kLeastDbm, kLargestDbm);
     std::array<int, 4> slots{};
     for (int& slot : slots) {
-        slot = whole(std::min(measured(power_dbm, 1.0, random), kLargest_dbm));
+        slot = whole(std::min(measured(power_dbm, 1.0, random), kLargestDbm));
     }
     encode(TransmitPower{slots}, out);
 }

@@ -13,8 +13,8 @@ namespace {
 
 using Phase = Activity::Phase;
 
-constexpr double kNoise_db = 0.6;
-constexpr int kLeastAccess_dbm = -105;
+constexpr double kNoiseDb = 0.6;
+constexpr int kLeastAccessDbm = -105;
 
 /// The modem wraps what has a unit or a name into a dictionary of its own.
 PropertyList wrapped(const char* key, std::string value) {
@@ -58,11 +58,11 @@ const char* stateOf(const Activity& activity) {
 PropertyList servingCell(const Scenario& scenario, Random& random) {
     const RadioLayer& layer = scenario.serving();
     const Cell& cell = layer.campedCell();
-    const int level_dbm = whole(measured(layer.campedLevel_dbm(), kNoise_db, random));
+    const int level_dbm = whole(measured(layer.campedLevel_dbm(), kNoiseDb, random));
     return Dictionary{{"ARFCN", std::to_string(cell.channel)},
                       {"BSIC", bsicOf(cell)},
                       {"Rx Level", levelOf(level_dbm)},
-                      {"C1", std::to_string(level_dbm - kLeastAccess_dbm)},
+                      {"C1", std::to_string(level_dbm - kLeastAccessDbm)},
                       {"Area", Dictionary{{"LAC", std::to_string(cell.area)},
                                           {"Cell ID", std::to_string(cell.identity)}}}};
 }
@@ -70,15 +70,15 @@ PropertyList servingCell(const Scenario& scenario, Random& random) {
 /// A header, then the cells; the BSIC of a weak one is not read, and then its channel stands
 /// alone.
 PropertyList neighbourCells(const Scenario& scenario, Random& random) {
-    constexpr int kReadable_dbm = -98;
+    constexpr int kReadableDbm = -98;
     constexpr std::size_t kMost = 6;
     const RadioLayer& layer = scenario.serving();
     const auto heard = layer.neighbours();
     Array list = {"ARFCN, BSIC, Rx Level"};
     for (const std::size_t index : heard.first(std::min(heard.size(), kMost))) {
         const Cell& cell = layer.cells()[index];
-        const int level_dbm = whole(measured(layer.level_dbm(index), kNoise_db, random));
-        if (level_dbm < kReadable_dbm) {
+        const int level_dbm = whole(measured(layer.level_dbm(index), kNoiseDb, random));
+        if (level_dbm < kReadableDbm) {
             list.push_back(wrapped("ARFCN", std::to_string(cell.channel)));
         } else {
             list.emplace_back(Dictionary{{"ARFCN", std::to_string(cell.channel)},
@@ -95,13 +95,13 @@ PropertyList dedicatedChannel(const Scenario& scenario, Random& random) {
     if (!activity.isConnected() && activity.phase() != Phase::Connecting) {
         return Dictionary{};
     }
-    constexpr double kPathToPower_db = -58;
-    constexpr double kLeastPower_dbm = 5;
-    constexpr double kMostPower_dbm = 33;
+    constexpr double kPathToPowerDb = -58;
+    constexpr double kLeastPowerDbm = 5;
+    constexpr double kMostPowerDbm = 33;
     const RadioLayer& layer = scenario.serving();
     const double below_db = layer.total_dbm() - layer.campedLevel_dbm();
     const double power_dbm =
-        std::clamp(kPathToPower_db - layer.campedLevel_dbm(), kLeastPower_dbm, kMostPower_dbm);
+        std::clamp(kPathToPowerDb - layer.campedLevel_dbm(), kLeastPowerDbm, kMostPowerDbm);
     const int quality = std::clamp(whole(below_db + random.normal() / 2), 0, 7);
     Dictionary channel{{"Channel", wrapped("Type", activity.isConnected() ? "TCH/F" : "SDCCH/8")},
                        {"Time Slot", activity.isConnected() ? "3" : "1"},

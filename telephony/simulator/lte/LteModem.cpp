@@ -22,33 +22,33 @@ constexpr unsigned kUplinkDistance = 18000;
 constexpr unsigned kBand = 3;
 constexpr unsigned kResourceBlocks = 100;
 constexpr unsigned kServingPriority = 5;
-constexpr int kQrxlevmin_dbm = -122;
-constexpr int kLargestPower_dbm = 23;
+constexpr int kQrxlevminDbm = -122;
+constexpr int kLargestPowerDbm = 23;
 /// Below that much above Qrxlevmin other carriers are searched.
-constexpr int kSearch_db = 26;
+constexpr int kSearchDb = 26;
 
 /// What is measured differs so much from what is smoothed.
-constexpr double kLevelNoise_db = 0.5;
-constexpr double kQualityNoise_db = 0.3;
+constexpr double kLevelNoiseDb = 0.5;
+constexpr double kQualityNoiseDb = 0.3;
 
 /// The part of the carrier that is the cell's: the more of the carrier is in use, the less.
 double rsrq_db(const Scenario& scenario, double level_dbm) {
-    constexpr double kAlone_db = -5.5;
-    constexpr double kLoad_db = -3;
-    return level_dbm - scenario.layer(kLte).total_dbm() + kAlone_db +
-           kLoad_db * scenario.activity().load();
+    constexpr double kAloneDb = -5.5;
+    constexpr double kLoadDb = -3;
+    return level_dbm - scenario.layer(kLte).total_dbm() + kAloneDb +
+           kLoadDb * scenario.activity().load();
 }
 
 /// The whole carrier is that much stronger than one of its tones.
 double rssi_dbm(double level_dbm, double quality_db) {
-    constexpr double kResourceBlocks_db = 20;
-    return level_dbm - quality_db + kResourceBlocks_db;
+    constexpr double kResourceBlocksDb = 20;
+    return level_dbm - quality_db + kResourceBlocksDb;
 }
 
 // A cell whose part of the carrier is small is not found, and one that is found is not always
 // measured.
-constexpr double kMeasuredBelowTotal_db = -10.5;
-constexpr double kFoundBelowTotal_db = -14;
+constexpr double kMeasuredBelowTotalDb = -10.5;
+constexpr double kFoundBelowTotalDb = -14;
 
 double belowTotal_db(const RadioLayer& layer, std::size_t cell) {
     return layer.level_dbm(cell) - layer.total_dbm();
@@ -57,11 +57,11 @@ double belowTotal_db(const RadioLayer& layer, std::size_t cell) {
 /// The strongest neighbour can be measured; the others are weaker.
 bool hasNeighbours(const RadioLayer& layer) {
     return !layer.neighbours().empty() &&
-           belowTotal_db(layer, layer.neighbours().front()) > kMeasuredBelowTotal_db;
+           belowTotal_db(layer, layer.neighbours().front()) > kMeasuredBelowTotalDb;
 }
 
 int srxlev_db(double level_dbm) {
-    return whole(level_dbm) - kQrxlevmin_dbm;
+    return whole(level_dbm) - kQrxlevminDbm;
 }
 
 void reportServing(const Scenario& scenario, Random& random, ByteBuffer& out) {
@@ -69,23 +69,23 @@ void reportServing(const Scenario& scenario, Random& random, ByteBuffer& out) {
     const double level_dbm = layer.campedLevel_dbm();
     const double quality_db = rsrq_db(scenario, level_dbm);
     const int srxlev = srxlev_db(level_dbm);
-    const bool searches = srxlev < kSearch_db;
+    const bool searches = srxlev < kSearchDb;
     lte::IdleServing serving{};
     serving.earfcn = layer.campedCell().channel;
     serving.physicalCellId = layer.campedCell().code;
     serving.layerPriority = kServingPriority;
-    serving.rsrp_dbm = measured(level_dbm, kLevelNoise_db, random);
+    serving.rsrp_dbm = measured(level_dbm, kLevelNoiseDb, random);
     serving.averageRsrp_dbm = level_dbm;
-    serving.rsrq_db = measured(quality_db, kQualityNoise_db, random);
+    serving.rsrq_db = measured(quality_db, kQualityNoiseDb, random);
     serving.averageRsrq_db = quality_db;
     serving.rssi_dbm = rssi_dbm(level_dbm, quality_db);
-    serving.qrxlevmin_dbm = kQrxlevmin_dbm;
-    serving.largestPower_dbm = kLargestPower_dbm;
-    serving.ownLargestPower_dbm = kLargestPower_dbm;
+    serving.qrxlevmin_dbm = kQrxlevminDbm;
+    serving.largestPower_dbm = kLargestPowerDbm;
+    serving.ownLargestPower_dbm = kLargestPowerDbm;
     serving.srxlev_db = srxlev;
     serving.cyclesBelow = srxlev < 0 ? 1 : 0;
     serving.intraSearch_db = 62;
-    serving.nonIntraSearch_db = kSearch_db;
+    serving.nonIntraSearch_db = kSearchDb;
     serving.rulesUpdated = searches;
     serving.rules = searches ? 2 : 1;
     lte::encode(serving, out);
@@ -96,7 +96,7 @@ void reportNeighbours(const Scenario& scenario, Random& random, ByteBuffer& out)
     std::array<lte::IdleNeighbour, RadioLayer::kMostHeard> cells{};
     std::size_t count = 0;
     for (const std::size_t index : layer.neighbours()) {
-        if (belowTotal_db(layer, index) <= kMeasuredBelowTotal_db) {
+        if (belowTotal_db(layer, index) <= kMeasuredBelowTotalDb) {
             break;
         }
         const Cell& cell = layer.cells()[index];
@@ -107,16 +107,16 @@ void reportNeighbours(const Scenario& scenario, Random& random, ByteBuffer& out)
         constexpr unsigned kSamplesPerFrame = 307200;
         cells[count++] = {cell.code,
                           rssi_dbm(level_dbm, quality_db),
-                          measured(level_dbm, kLevelNoise_db, random),
+                          measured(level_dbm, kLevelNoiseDb, random),
                           level_dbm,
-                          measured(quality_db, kQualityNoise_db, random),
+                          measured(quality_db, kQualityNoiseDb, random),
                           quality_db,
                           srxlev_db(level_dbm),
                           cell.code % 13 + 20,
                           cell.identity % kFrameLength,
                           cell.identity * cell.code % kSamplesPerFrame};
     }
-    lte::encode(lte::IdleNeighbours{kEarfcn, kQrxlevmin_dbm, std::span(cells.data(), count)}, out);
+    lte::encode(lte::IdleNeighbours{kEarfcn, kQrxlevminDbm, std::span(cells.data(), count)}, out);
 }
 
 void reportConnected(const Scenario& scenario, Random& random, ByteBuffer& out) {
@@ -127,8 +127,8 @@ void reportConnected(const Scenario& scenario, Random& random, ByteBuffer& out) 
     const auto levelsOf = [&](std::size_t index) {
         const double level_dbm = layer.level_dbm(index);
         return lte::ConnectedCell{layer.cells()[index].code,
-                                  measured(level_dbm, kLevelNoise_db, random),
-                                  measured(rsrq_db(scenario, level_dbm), kQualityNoise_db, random)};
+                                  measured(level_dbm, kLevelNoiseDb, random),
+                                  measured(rsrq_db(scenario, level_dbm), kQualityNoiseDb, random)};
     };
     std::array<lte::ConnectedCell, kMostMeasured> neighbours{};
     std::array<unsigned, kMostDetected> detected{};
@@ -136,9 +136,9 @@ void reportConnected(const Scenario& scenario, Random& random, ByteBuffer& out) 
     std::size_t detectedCount = 0;
     for (const std::size_t index : layer.neighbours()) {
         const double part_db = belowTotal_db(layer, index);
-        if (part_db > kMeasuredBelowTotal_db && measuredCount < kMostMeasured) {
+        if (part_db > kMeasuredBelowTotalDb && measuredCount < kMostMeasured) {
             neighbours[measuredCount++] = levelsOf(index);
-        } else if (part_db > kFoundBelowTotal_db && detectedCount < kMostDetected) {
+        } else if (part_db > kFoundBelowTotalDb && detectedCount < kMostDetected) {
             detected[detectedCount++] = layer.cells()[index].code;
         }
     }
@@ -229,7 +229,7 @@ void LteModem::observe(const Scenario& scenario, RecordQueue& queue) {
 
 void LteModem::report(const Scenario& scenario, Random& random, ByteBuffer& out) {
     ReportMix<kKindCount>::Shares shares{};
-    shares[kMonitor] = 2;
+    shares[kMonitor] = 1;
     if (scenario.activity().isConnected()) {
         shares[kConnected] = 78;
     } else {
@@ -285,7 +285,7 @@ void LteModem::reportCellMonitor(const Scenario& scenario, ByteBuffer& out) {
                                      {kHXCellMonitorCellId, serving.identity},
                                      {kHXCellMonitorBandInfo, kBand}})};
     for (const std::size_t index : layer.neighbours()) {
-        if (belowTotal_db(layer, index) <= kMeasuredBelowTotal_db) {
+        if (belowTotal_db(layer, index) <= kMeasuredBelowTotalDb) {
             break;
         }
         const Cell& cell = layer.cells()[index];

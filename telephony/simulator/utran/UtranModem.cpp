@@ -19,13 +19,13 @@ enum Layer : std::size_t { kUtran, kGsm, kLayerCount };
 constexpr unsigned kFirstArea = 0x1A2B;
 constexpr unsigned kFirstUra = 3;
 constexpr unsigned kBand = 34;
-constexpr double kNoise_db = 0.6;
+constexpr double kNoiseDb = 0.6;
 
 /// From the weakest level that is heard on, to the 256 steps of the record.
 unsigned filteredRscp(double level_dbm) {
-    constexpr double kLeast_dbm = -116;
-    constexpr double kStep_db = 0.3;
-    return rawOf(level_dbm, kLeast_dbm, kStep_db, 8);
+    constexpr double kLeastDbm = -116;
+    constexpr double kStepDb = 0.3;
+    return rawOf(level_dbm, kLeastDbm, kStepDb, 8);
 }
 
 void encodeServing(const Scenario& scenario, ByteBuffer& out) {
@@ -44,7 +44,7 @@ void reportNeighbours(const Scenario& scenario, Random& random, ByteBuffer& out)
     std::size_t count = 0;
     const auto add = [&](std::size_t index, utran::Set set) {
         const Cell& cell = layer.cells()[index];
-        const double level_dbm = measured(layer.level_dbm(index), kNoise_db, random);
+        const double level_dbm = measured(layer.level_dbm(index), kNoiseDb, random);
         cells[count++] = {cell.channel, cell.code, filteredRscp(level_dbm), set,
                           set == utran::Set::Active};
     };
@@ -69,7 +69,7 @@ void reportGsmNeighbours(const Scenario& scenario, Random& random, ByteBuffer& o
                         cell.code >> kBccBits,
                         cell.code & kBccMask,
                         cell.channel,
-                        whole(measured(layer.level_dbm(index), kNoise_db, random))};
+                        whole(measured(layer.level_dbm(index), kNoiseDb, random))};
         ++count;
     }
     utran::encode(std::span<const utran::GsmNeighbour>(cells.data(), count), out);
@@ -182,12 +182,12 @@ void UtranModem::observe(const Scenario& scenario, RecordQueue& queue) {
 
 void UtranModem::report(const Scenario& scenario, Random& random, ByteBuffer& out) {
     ReportMix<kKindCount>::Shares shares{};
-    shares[kMode] = 2;
-    shares[kServing] = 2;
-    shares[kMonitor] = 2;
-    shares[kNeighbours] = 40;
-    shares[kGsmNeighbours] = 14;
-    shares[kQuality] = scenario.activity().isConnected() ? 20 : 0;
+    shares[kMode] = 4;
+    shares[kServing] = 4;
+    shares[kMonitor] = 1;
+    shares[kNeighbours] = 80;
+    shares[kGsmNeighbours] = 28;
+    shares[kQuality] = scenario.activity().isConnected() ? 40 : 0;
     switch (_mix.next(shares)) {
     case kMode:
         return utran::encode(_mode, out);

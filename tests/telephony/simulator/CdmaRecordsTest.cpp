@@ -8,8 +8,8 @@
 namespace pallax {
 namespace {
 
-constexpr double kRounding_db = 0.05;
-constexpr double kGainRounding_db = 0.18; // half a step, and half a hundredth
+constexpr double kRoundingDb = 0.05;
+constexpr double kGainRoundingDb = 0.18; // half a step, and half a hundredth
 
 /// "0;168", the key of an entry in a list of pilots.
 std::string keyOf(std::size_t index, unsigned pn) {
@@ -63,7 +63,7 @@ TEST(CdmaRecords, PilotsAndFingersAreShownAsEncoded) {
             for (std::size_t index = 0; index < list.size(); ++index) {
                 const std::string shown =
                     DecodedDisplay::textIn(*section, keyOf(index, list[index].pn));
-                RC_ASSERT(std::abs(numberOf(shown) - list[index].part_db) < kRounding_db);
+                RC_ASSERT(std::abs(numberOf(shown) - list[index].part_db) < kRoundingDb);
             }
         }
     }));
@@ -89,8 +89,8 @@ TEST(CdmaRecords, TheOneXStatusIsShownAsEncoded) {
         const auto level = [&](const char* receiver) {
             return numberOf(DecodedDisplay::textIn(*keys->find(receiver), "AGC"));
         };
-        RC_ASSERT(std::abs(level("Receiver 0") - status.receive0_dbm) < kGainRounding_db);
-        RC_ASSERT(std::abs(level("Receiver 1") - status.receive1_dbm) < kGainRounding_db);
+        RC_ASSERT(std::abs(level("Receiver 0") - status.receive0_dbm) < kGainRoundingDb);
+        RC_ASSERT(std::abs(level("Receiver 1") - status.receive1_dbm) < kGainRoundingDb);
         RC_ASSERT(decoded.text("1x", "Transmit AGC") ==
                   formatText("%+.2f dBm", {std::round(status.transmit_dbm * 10) / 10}));
         for (std::size_t index = 0; index < list.size(); ++index) {
@@ -100,7 +100,7 @@ TEST(CdmaRecords, TheOneXStatusIsShownAsEncoded) {
             const bool isReference = list[index].pn == list.front().pn;
             RC_ASSERT(shown.starts_with(kReference) == isReference);
             shown.erase(0, isReference ? kReference.size() : 0);
-            RC_ASSERT(std::abs(numberOf(shown) - list[index].part_db) < kRounding_db);
+            RC_ASSERT(std::abs(numberOf(shown) - list[index].part_db) < kRoundingDb);
         }
     }));
 }

@@ -70,7 +70,7 @@ TEST(LteSimulation, TheRecordsAgreeAboutTheServingCellAndItsNeighbours) {
 
 TEST(LteSimulation, LevelsAreInRangeAndMoveSmoothlyWhileOneCellServes) {
     // A step of 200 ms at 17 m/s, with shadowing and noise at their bounds.
-    constexpr double kLargestStep_db = 5;
+    constexpr double kLargestStepDb = 5;
     for (std::uint64_t seed = 0; seed < kSeeds && !testing::Test::HasFailure(); ++seed) {
         SCOPED_TRACE("seed " + std::to_string(seed));
         DecodedDisplay decoded("lte");
@@ -96,7 +96,7 @@ TEST(LteSimulation, LevelsAreInRangeAndMoveSmoothlyWhileOneCellServes) {
             EXPECT_TRUE(quality_db >= -20 && quality_db <= -3) << quality_db;
             const std::string serving = decoded.text(kInfo, "Physical Cell ID");
             if (serving == cell && packet->time - lastTime < Scenario::kStep) {
-                EXPECT_LE(std::abs(level_dbm - last_dbm), kLargestStep_db);
+                EXPECT_LE(std::abs(level_dbm - last_dbm), kLargestStepDb);
             }
             cell = serving;
             last_dbm = level_dbm;

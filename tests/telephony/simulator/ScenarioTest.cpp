@@ -79,7 +79,7 @@ TEST(Scenario, ACellIsLeftOnlyForOneThatIsBetter) {
 }
 
 TEST(Scenario, LevelsMoveSmoothly) {
-    constexpr double kLargestStep_db = 4;
+    constexpr double kLargestStepDb = 4;
     Scenario scenario(LteModem::plan(), 11);
     const RadioLayer& layer = scenario.layer(0);
     std::vector<double> before;
@@ -90,7 +90,7 @@ TEST(Scenario, LevelsMoveSmoothly) {
         }
         scenario.step();
         for (std::size_t cell = 0; cell < layer.cells().size(); ++cell) {
-            EXPECT_LE(std::abs(layer.level_dbm(cell) - before[cell]), kLargestStep_db);
+            EXPECT_LE(std::abs(layer.level_dbm(cell) - before[cell]), kLargestStepDb);
         }
     }
 }
