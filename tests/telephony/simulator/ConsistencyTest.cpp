@@ -11,11 +11,11 @@ namespace {
 
 using std::chrono::seconds;
 
-constexpr std::uint64_t kSeeds = 100;
+constexpr std::uint64_t kSeeds = PALLAX_DRIVES;
 /// Few packets a second, for every one is decoded and looked at; the drive is the same.
 constexpr unsigned kRate = 5;
 
-/// Calls `check` after each packet of a hundred drives, with its code (0 of an object stream).
+/// Calls `check` after each packet of many drives, with its code (0 of an object stream).
 void inEveryDrive(std::string_view technology, seconds duration,
                   const std::function<void(const DecodedDisplay&, std::uint32_t)>& check) {
     for (std::uint64_t seed = 0; seed < kSeeds && !testing::Test::HasFailure(); ++seed) {

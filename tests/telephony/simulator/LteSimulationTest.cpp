@@ -10,7 +10,7 @@ namespace {
 
 using std::chrono::seconds;
 
-constexpr std::uint64_t kSeeds = 100;
+constexpr std::uint64_t kSeeds = PALLAX_DRIVES;
 constexpr std::string_view kInfo = "Serving Cell Info";
 constexpr std::string_view kIdle = "Serving Cell Measurements";
 constexpr std::string_view kConnected = "Connected mode LTE Intra-frequency Measurement";
