@@ -115,13 +115,13 @@ void reportHsdpa(const Scenario& scenario, Random& random, ByteBuffer& out) {
     constexpr unsigned kSubFrames = 100;
     constexpr double kBitsPerTransmission = 11000;
     constexpr std::size_t kProcesses = 6;
+    constexpr unsigned kTurns = kSubFrames / kProcesses; // of a process; whole ones
     // Two carriers where there is much to be had.
     constexpr double kSecondCarrierLoad = 0.6;
     const double load = scenario.activity().load();
     const bool dual = load > kSecondCarrierLoad;
     const auto process = [&](unsigned id) {
-        const auto transmissions =
-            static_cast<unsigned>(kSubFrames / kProcesses * load + random.between(0, 2));
+        const auto transmissions = static_cast<unsigned>(kTurns * load + random.between(0, 2));
         const double bits = transmissions * kBitsPerTransmission * random.between(0.9, 1.0);
         return HarqProcess{id, static_cast<std::uint32_t>(bits), transmissions,
                            errorsOf(transmissions, scenario, random)};
