@@ -337,14 +337,11 @@ void FrontEnd::escape(TerminalTable& table) {
 }
 
 void FrontEnd::save() {
-    const ui::BarItems& items = _toolkit.navigation()->top().toolbarItems();
-    const auto button = std::find_if(items.begin(), items.end(), [](const ui::BarItem& item) {
-        return std::holds_alternative<ui::SaveButton>(item);
-    });
-    if (button == items.end()) {
+    const ui::SaveButton* button = saveButtonOf(_toolkit.navigation()->top().toolbarItems());
+    if (button == nullptr) {
         return setMessage("Saving is not enabled here");
     }
-    const auto action = std::get<ui::SaveButton>(*button).action; // the items may be replaced
+    const auto action = button->action; // a copy, for the items may be replaced
     action();
 }
 

@@ -28,15 +28,6 @@ const ui::Label* labelOf(const ui::BarItems& items) {
     return nullptr;
 }
 
-const ui::SaveButton* saveButtonOf(const ui::BarItems& items) {
-    for (const ui::BarItem& item : items) {
-        if (const auto* button = std::get_if<ui::SaveButton>(&item)) {
-            return button;
-        }
-    }
-    return nullptr;
-}
-
 /// The titles joined, the first ones left out until the rest fits.
 std::string breadcrumbs(const TerminalNavigation& navigation, const Marks& marks, int columns) {
     const auto& screens = navigation.screens();
@@ -75,6 +66,15 @@ Range wholeCharacters(std::string_view text, Range range) {
 }
 
 } // namespace
+
+const ui::SaveButton* saveButtonOf(const ui::BarItems& items) {
+    for (const ui::BarItem& item : items) {
+        if (const auto* button = std::get_if<ui::SaveButton>(&item)) {
+            return button;
+        }
+    }
+    return nullptr;
+}
 
 bool isLoading(const ui::BarItems& items) {
     return std::any_of(items.begin(), items.end(), [](const ui::BarItem& item) {

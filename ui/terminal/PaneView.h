@@ -24,6 +24,8 @@ struct PaneStatus {
 
 /// Whether the toolbar's activity indicator turns.
 bool isLoading(const ui::BarItems& items);
+/// The toolbar's save button, or null.
+const ui::SaveButton* saveButtonOf(const ui::BarItems& items);
 
 /// Draws the topmost pane: the way to it, its rows, and the toolbar.
 class PaneView {
