@@ -1,4 +1,5 @@
 #include "platform/Utf8.h"
+#include "tests/doubles/Property.h"
 #include "tests/platform/PropertyListSupport.h"
 
 #include <gtest/gtest.h>
@@ -139,7 +140,7 @@ void appendAsText(std::string& out, const PropertyList& object) {
 }
 
 TEST(PropertyListRoundTrip, XmlReadsBackAsItWasWritten) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const PropertyList list = *values(Reach::kXml, kDepth);
         const auto xml = serializeXml(list);
         RC_ASSERT(refusalOf(xml) == "");
@@ -151,7 +152,7 @@ TEST(PropertyListRoundTrip, XmlReadsBackAsItWasWritten) {
 }
 
 TEST(PropertyListRoundTrip, BinaryReadsBackAsItWasWritten) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const PropertyList list = *values(Reach::kBinary, kDepth);
         const auto bytes = serializeBinary(list);
         RC_ASSERT(refusalOf(bytes) == "");
@@ -163,7 +164,7 @@ TEST(PropertyListRoundTrip, BinaryReadsBackAsItWasWritten) {
 }
 
 TEST(PropertyListRoundTrip, TextReadsBackAsItWasWritten) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const PropertyList list = *values(Reach::kText, kDepth);
         std::string text;
         appendAsText(text, list);

@@ -1,4 +1,5 @@
 #include "platform/TimeGrid.h"
+#include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck.h>
@@ -58,7 +59,7 @@ TEST(TimeGrid, AMomentBeyondTheRangeIsItsEnd) {
 }
 
 TEST(TimeGrid, GivesWhatSteppingGives) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const auto interval = nanoseconds(*rc::gen::inRange(1, 1000));
         const auto time = kFirst + nanoseconds(*rc::gen::inRange(0, 20000));
         std::uint64_t passed = 0;

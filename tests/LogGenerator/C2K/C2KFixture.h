@@ -4,6 +4,7 @@
 #include "app/tree/PallaxModelNode.h"
 #include "tests/doubles/C2KLookupNames.h"
 #include "tests/doubles/GeneratorFixture.h"
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordProperties.h"
 
 #include <rapidcheck.h>
@@ -134,14 +135,14 @@ inline Record anyPacket(LogCode code, const std::vector<std::size_t>& lengths) {
                             ? *rc::gen::elementOf(lengths)
                             : *rc::gen::inRange(LogRecord::kHeaderLength, largest + 1);
     const unsigned bound = *rc::gen::element(kSmall, kAny);
-    const ByteBuffer payload = *bytesBelow(bound, length - LogRecord::kHeaderLength);
+    const ByteBuffer payload = any::bytesBelow(bound, length - LogRecord::kHeaderLength);
     return Record(code).append(Bytes(payload));
 }
 
 /// Holds that packets of any bytes under a code write no other rows; every text is made once.
 inline void anyPacketWritesOnly(LogCode code, const std::vector<std::string>& names,
                                 const std::vector<std::size_t>& lengths) {
-    EXPECT_TRUE(rc::check([&names, code, &lengths] {
+    EXPECT_TRUE(doubles::holds([&names, code, &lengths] {
         C2KFixture fixture;
         fixture.mark();
         for (int count = *rc::gen::inRange(1, 4); count > 0; --count) {

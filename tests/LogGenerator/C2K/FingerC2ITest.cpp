@@ -1,6 +1,7 @@
 #include "LogGenerator/C2K/FingerC2I.h"
 
 #include "tests/LogGenerator/C2K/C2KFixture.h"
+#include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
 
@@ -108,7 +109,7 @@ TEST(FingerC2I, TheRatioIsComputedInDoublePrecision) {
 }
 
 TEST(FingerC2I, AnyFingersWriteOnlyItsRow) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         C2KFixture fixture;
         std::vector<Finger> any;
         for (int count = *rc::gen::inRange(0, 6); count > 0; --count) {

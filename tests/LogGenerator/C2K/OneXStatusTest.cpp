@@ -3,6 +3,7 @@
 #include "LogGenerator/C2K/TrafficFER.h"
 #include "tests/LogGenerator/C2K/C2KFixture.h"
 #include "tests/LogGenerator/C2K/OneXRecords.h"
+#include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
 
@@ -207,7 +208,7 @@ TEST(OneXStatus, WithoutAnyRateNoneIsShownAsOld) {
 }
 
 TEST(OneXStatus, AnySubpacketsWriteOnlyItsRows) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         C2KFixture fixture;
         fixture.state.set("TrafficFER", PropertyList::real(0.5));
         const Dictionary rows = fixture.writtenBy(

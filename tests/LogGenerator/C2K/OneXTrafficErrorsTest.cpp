@@ -3,6 +3,7 @@
 #include "LogGenerator/C2K/TrafficFER.h"
 #include "tests/LogGenerator/C2K/C2KFixture.h"
 #include "tests/LogGenerator/C2K/OneXRecords.h"
+#include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
 
@@ -142,7 +143,7 @@ TEST(OneXTrafficErrors, InACutPacketTheFrameCountsWhereverTheWalkFindsIt) {
 }
 
 TEST(OneXTrafficErrors, AnySubpacketsWriteOnlyItsRow) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         C2KFixture fixture;
         const Dictionary rows =
             fixture.writtenBy(packetOf(0x119D, {anySubpacket(5), anySubpacket(11)}));

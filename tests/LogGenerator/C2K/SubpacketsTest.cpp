@@ -1,6 +1,7 @@
 #include "LogGenerator/C2K/Subpackets.h"
 
 #include "tests/LogGenerator/C2K/OneXRecords.h"
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordProperties.h"
 #include "tests/doubles/RecordingLog.h"
 
@@ -98,7 +99,7 @@ TEST(Subpackets, AHeaderThatThePacketCutsIsReadAsFarAsItGoes) {
 }
 
 TEST(Subpackets, WhateverIsFoundHasItsIdAndLiesInThePacket) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         std::vector<Subpacket> subpackets;
         for (int count = *rc::gen::inRange(1, 6); count > 0; --count) {
             subpackets.push_back(anySubpacket(*rc::gen::inRange(1U, 5U)));

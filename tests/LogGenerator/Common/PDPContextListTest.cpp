@@ -1,4 +1,5 @@
 #include "LogGenerator/Common/PDPContextList.h"
+#include "tests/doubles/Property.h"
 
 #include "tests/doubles/PropertyListRecord.h"
 #include "tests/doubles/RecordFixture.h"
@@ -94,10 +95,10 @@ TEST(PDPContextList, AnyBytesNeitherThrowNorLeaveAKey) {
 }
 
 TEST(PDPContextList, AnyArrayIsShownAsItIsAndAnythingElseChangesNothing) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         RecordFixture<PDPContextList> fixture;
         fixture.list() = Array{"what was shown before"};
-        const PropertyList root = anyPropertyList({"APN", "Address"});
+        const PropertyList root = any::propertyList({"APN", "Address"});
         fixture.feed(propertyListRecord(kContexts, root));
         const bool list = root.array() != nullptr;
         RC_CLASSIFY(list);

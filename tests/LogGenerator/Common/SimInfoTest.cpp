@@ -1,6 +1,7 @@
 #include "LogGenerator/Common/SimInfo.h"
 
 #include "LogGenerator/Common/LogCode_0xFF000020.h"
+#include "tests/doubles/Property.h"
 #include "tests/doubles/PropertyListRecord.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
@@ -178,9 +179,9 @@ TEST(SimInfo, WhateverTheServiceSendsForAFileIsShownUnderItsKey) {
     for (const auto& row : kFilesToKeys) {
         files.emplace_back(row.first);
     }
-    EXPECT_TRUE(rc::check([&files] {
+    EXPECT_TRUE(doubles::holds([&files] {
         RecordFixture<SimInfo> fixture;
-        const PropertyList root = anyPropertyList(files);
+        const PropertyList root = any::propertyList(files);
         fixture.feed(propertyListRecord(kSimFiles, root));
         Dictionary expected;
         for (const auto& [file, key] : kFilesToKeys) {

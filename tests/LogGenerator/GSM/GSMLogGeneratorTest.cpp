@@ -4,6 +4,7 @@
 #include "app/tree/PallaxModelNode.h"
 #include "tests/LogGenerator/GSM/ObjectStream.h"
 #include "tests/doubles/GeneratorFixture.h"
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordingLog.h"
 
 #include <gtest/gtest.h>
@@ -289,7 +290,7 @@ TEST_F(GSMLogGeneratorTest, DeeperNestingIsUndecodable) {
 }
 
 TEST(GSMLogGeneratorProperty, TheThreeFormsOfAMessageAreDisplayedAlike) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         Stream stream;
         const PropertyList object = anyMessage();
         const std::string expected = GSMLogGenerator::processObject(object).description();
@@ -303,7 +304,7 @@ TEST(GSMLogGeneratorProperty, TheThreeFormsOfAMessageAreDisplayedAlike) {
 }
 
 TEST(GSMLogGeneratorProperty, AValueOfAnotherTypeAnywhereLeavesTheStateAsItWas) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         Stream stream;
         stream.feed(xmlMessage(anyMessage()));
         const std::string before = PropertyList(stream.state).description();
@@ -327,7 +328,7 @@ TEST(GSMLogGeneratorProperty, AValueOfAnotherTypeAnywhereLeavesTheStateAsItWas) 
 }
 
 TEST(GSMLogGeneratorProperty, AnyBytesAreDisplayedOrLeaveTheStateAsItWas) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         Stream stream;
         stream.feed(xmlMessage(kExample));
         const std::string before = PropertyList(stream.state).description();

@@ -1,5 +1,6 @@
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "tests/LogGenerator/GSM/ObjectStream.h"
+#include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck.h>
@@ -210,7 +211,7 @@ TEST(CanCollapse, GivesNullForAnythingElse) {
 }
 
 TEST(ProcessObjectProperty, BelowTheTopNoDictionaryHasOneEntry) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const PropertyList object = anyMessage();
         RC_CLASSIFY(holdsOneEntryDictionary(object), "with something to collapse");
         RC_ASSERT(!holdsOneEntryDictionary(processed(object)));
@@ -218,7 +219,7 @@ TEST(ProcessObjectProperty, BelowTheTopNoDictionaryHasOneEntry) {
 }
 
 TEST(ProcessObjectProperty, TheTopLevelKeepsItsKeysAndTheObjectItsContent) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const PropertyList object = anyMessage();
         const std::string before = object.description();
         const DictionaryRef form = processed(object).dictionary();
@@ -230,7 +231,7 @@ TEST(ProcessObjectProperty, TheTopLevelKeepsItsKeysAndTheObjectItsContent) {
 }
 
 TEST(ProcessObjectProperty, AnArrayIsShorterByOne) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         Array elements;
         for (int count = *rc::gen::inRange(0, 6); count > 0; --count) {
             elements.push_back(anyObject(2));
@@ -241,14 +242,14 @@ TEST(ProcessObjectProperty, AnArrayIsShorterByOne) {
 }
 
 TEST(ProcessObjectProperty, WithoutArraysTheFormIsItsOwnForm) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const PropertyList form = processed(anyMessage(false));
         RC_ASSERT(processed(form).description() == form.description());
     }));
 }
 
 TEST(ProcessObjectProperty, AnyChainFoldsToItsInnermostValue) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const PropertyList innermost = anyObject(2);
         PropertyList chain = innermost;
         for (int links = *rc::gen::inRange(1, 40); links > 0; --links) {

@@ -118,7 +118,7 @@ TEST(CCTRCHSIRMeasurement, AnyBytesKeepItsEntriesWithinItsKeys) {
     anyRecordsKeepWithin<CCTRCHSIRMeasurement,
                          NothingThrown>(keys, codesOf<CCTRCHSIRMeasurement>(), [](LogCode) {
         const auto transport = *rc::gen::inRange(0U, 64U);
-        return channels(transport, *rc::gen::inRange(0U, 16U)).append(*anyRecordBytes()).bytes();
+        return channels(transport, *rc::gen::inRange(0U, 16U)).append(any::recordBytes()).bytes();
     });
 }
 

@@ -1,4 +1,5 @@
 #include "LogGenerator/UTRAN/GSMNeighbhorMeasurements.h"
+#include "tests/doubles/Property.h"
 
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
@@ -104,8 +105,8 @@ TEST(GSMNeighbhorMeasurements, AnyBytesKeepItsSectionEmpty) {
 }
 
 TEST(GSMNeighbhorMeasurements, AnyBytesKeepItsCellsWithinTheirKeys) {
-    EXPECT_TRUE(rc::check([] {
-        const ByteBuffer bytes = *anyRecordBytes();
+    EXPECT_TRUE(doubles::holds([] {
+        const ByteBuffer bytes = any::recordBytes();
         RC_ASSERT(keepsWithin(
             GSMNeighbhorMeasurements::cellsOf(LogRecord(bytes)),
             {"Cell ID", "Band Indicator", "BSIC Valid", "NCC", "BCC", "ARFCN", "RSSI"}));

@@ -150,9 +150,9 @@ TEST(UTRANNeighbhorMeasurements, AnyBytesKeepItsEntriesWithinItsKeys) {
     anyRecordsKeepWithin<UTRANNeighbhorMeasurements, NothingThrown>(
         keys, codesOf<UTRANNeighbhorMeasurements>(), [](LogCode code) {
             return Record(code)
-                .append(*anyRecordBytes())
+                .append(any::recordBytes())
                 .padTo(kEntries)
-                .append(*anyRecordBytes())
+                .append(any::recordBytes())
                 .bytes();
         });
 }

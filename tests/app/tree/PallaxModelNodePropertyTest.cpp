@@ -1,4 +1,5 @@
 #include "app/tree/PallaxModelNode.h"
+#include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck.h>
@@ -75,7 +76,7 @@ void walk(const NodeRef& node, const std::string& path, const Visit& visit) {
 }
 
 TEST(PallaxModelNodeProperty, EveryPathLeadsToTheLastNodeThatStandsThere) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         PathDictionary paths;
         const NodeRef root = PallaxModelNode::makeTreeFromObject(randomObject(kDeepest), paths);
         PathDictionary expected;
@@ -88,7 +89,7 @@ TEST(PallaxModelNodeProperty, EveryPathLeadsToTheLastNodeThatStandsThere) {
 }
 
 TEST(PallaxModelNodeProperty, EveryValueHasExactlyOneNodeOfItsKind) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const PropertyList object = randomObject(kDeepest);
         PathDictionary paths;
         const NodeRef root = PallaxModelNode::makeTreeFromObject(object, paths);

@@ -1,4 +1,5 @@
 #include "tests/ui/terminal/StageScript.h"
+#include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck.h>
@@ -22,7 +23,7 @@ rc::Gen<std::vector<std::uint8_t>> scripts() {
 }
 
 TEST(FrontEndPropertyTest, WhateverHappensTheScreenIsWholeAndTheCursorOnARow) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const std::vector<std::uint8_t> script = *scripts();
         RC_ASSERT(StageScript(script).play() == "");
     }));

@@ -1,4 +1,5 @@
 #include "ui/terminal/Grid.h"
+#include "tests/doubles/Property.h"
 
 #include "tests/ui/terminal/GridSupport.h"
 
@@ -180,7 +181,7 @@ rc::Gen<std::string> texts() {
 }
 
 TEST(GridTest, WhateverIsPutWhereverEveryRowFillsItsColumns) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         Grid grid(*rc::gen::inRange(0, 12), *rc::gen::inRange(0, 3));
         const int puts = *rc::gen::inRange(1, 40);
         for (int count = 0; count < puts; ++count) {

@@ -1,6 +1,7 @@
 #include "ui/terminal/LineEditor.h"
 
 #include "platform/Utf8.h"
+#include "tests/doubles/Property.h"
 #include "ui/terminal/TextWidth.h"
 
 #include <gtest/gtest.h>
@@ -216,7 +217,7 @@ TEST_F(LineEditorTest, WhateverIsPressedTheTextIsUtf8AndTheCursorBetweenTwoChara
                      [](std::uint32_t any) { return char32_t{any % 0x120000U}; }));
     const auto keys = rc::gen::element(Key::Left, Key::Right, Key::Home, Key::End, Key::Backspace,
                                        Key::Delete, Key::Character, Key::Character);
-    EXPECT_TRUE(rc::check([&] {
+    EXPECT_TRUE(doubles::holds([&] {
         LineEditor any;
         const auto presses = *rc::gen::container<std::vector<std::pair<Key, char32_t>>>(
             rc::gen::pair(keys, characters));

@@ -1,4 +1,5 @@
 #include "ui/terminal/TerminalTable.h"
+#include "tests/doubles/Property.h"
 
 #include "tests/ui/terminal/TextRows.h"
 #include "ui/terminal/TerminalToolkit.h"
@@ -317,7 +318,7 @@ TEST(FindIgnoringCaseTest, FindsAsciiInAnyCaseAndOtherBytesAsTheyAre) {
 }
 
 TEST_F(TerminalTableTest, WhateverHappensTheCursorIsOnARowInTheWindow) {
-    EXPECT_TRUE(rc::check([this] {
+    EXPECT_TRUE(doubles::holds([this] {
         const auto names = rc::gen::container<std::vector<std::string>>(
             rc::gen::element<std::string>("A", "B", "C", "xA", "xB", "xC"));
         const int steps = *rc::gen::inRange(1, 30);
