@@ -20,11 +20,17 @@ if(PALLAX_SANITIZE)
     )
     target_link_options(pallax_options INTERFACE -fsanitize=${PALLAX_SANITIZE})
 endif()
-if(PALLAX_BUILD_FUZZERS)
+# An index past the end of a standard container ends a test run, not only under sanitizers.
+target_compile_definitions(pallax_options INTERFACE "$<$<CONFIG:Debug>:_GLIBCXX_ASSERTIONS>")
+if(PALLAX_COVERAGE)
+    # Counters only in what is measured: those of the libraries that tests and templates pull in
+    # would double the build. Every process adds to one of four files for its executable.
+    set(counters -fprofile-instr-generate=${PROJECT_BINARY_DIR}/profile/%4m.profraw)
     target_compile_options(pallax_options INTERFACE
-        -fsanitize=fuzzer-no-link,address,undefined -fno-sanitize-recover=all
+        ${counters} -fcoverage-mapping
+        -fprofile-list=${PROJECT_SOURCE_DIR}/cmake/coverage-sources
     )
-    target_link_options(pallax_options INTERFACE -fsanitize=address,undefined)
+    target_link_options(pallax_options INTERFACE ${counters})
 endif()
 
 # pallax_library(NAME SOURCES file... [LINKS library...])
@@ -33,6 +39,9 @@ function(pallax_library name)
     cmake_parse_arguments(ARG "" "" "SOURCES;LINKS" ${ARGN})
     add_library(${name} STATIC ${ARG_SOURCES})
     target_link_libraries(${name} PUBLIC pallax_options ${ARG_LINKS})
+    if(PALLAX_BUILD_FUZZERS)
+        target_compile_options(${name} PRIVATE -fsanitize=fuzzer-no-link)
+    endif()
 endfunction()
 
 # pallax_bundle(NAME library...): one static archive made of several.

@@ -83,6 +83,12 @@ void describe(std::string& out, const PropertyList& object) {
 
 } // namespace
 
+PropertyList::PropertyList(const PropertyList& other) = default;
+PropertyList::PropertyList(PropertyList&& other) noexcept = default;
+PropertyList& PropertyList::operator=(const PropertyList& other) = default;
+PropertyList& PropertyList::operator=(PropertyList&& other) noexcept = default;
+PropertyList::~PropertyList() = default;
+
 PropertyList::PropertyList(Array elements) : _value(std::make_shared<Array>(std::move(elements))) {}
 
 PropertyList::PropertyList(Dictionary entries)
@@ -186,6 +192,12 @@ bool operator==(const PropertyList& a, const PropertyList& b) {
         return a._value == b._value;
     }
 }
+
+Dictionary::Dictionary(const Dictionary& other) = default;
+Dictionary::Dictionary(Dictionary&& other) noexcept = default;
+Dictionary& Dictionary::operator=(const Dictionary& other) = default;
+Dictionary& Dictionary::operator=(Dictionary&& other) noexcept = default;
+Dictionary::~Dictionary() = default;
 
 Dictionary::Dictionary(std::initializer_list<std::pair<const char*, PropertyList>> entries) {
     reserve(entries.size());

@@ -48,6 +48,12 @@ public:
     };
 
     PropertyList() = default;
+    // Not inline: what a variant of ten types makes of them is large, and every file copies some.
+    PropertyList(const PropertyList& other);
+    PropertyList(PropertyList&& other) noexcept;
+    PropertyList& operator=(const PropertyList& other);
+    PropertyList& operator=(PropertyList&& other) noexcept;
+    ~PropertyList();
     PropertyList(Text text) : _value(std::move(text)) {}
     PropertyList(std::string text) : _value(Text(std::move(text))) {}
     PropertyList(const char* text) : _value(Text(text)) {}
@@ -125,6 +131,11 @@ public:
     };
 
     Dictionary() = default;
+    Dictionary(const Dictionary& other);
+    Dictionary(Dictionary&& other) noexcept;
+    Dictionary& operator=(const Dictionary& other);
+    Dictionary& operator=(Dictionary&& other) noexcept;
+    ~Dictionary();
     Dictionary(std::initializer_list<std::pair<const char*, PropertyList>> entries);
 
     /// The value under `key`, or null. The pointer is valid until the next change.
