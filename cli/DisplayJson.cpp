@@ -1,7 +1,7 @@
 #include "cli/DisplayJson.h"
 
-#include "cli/Printable.h"
 #include "platform/Base64.h"
+#include "platform/Printable.h"
 #include "platform/Utf8.h"
 
 #include <algorithm>

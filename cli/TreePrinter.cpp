@@ -1,7 +1,7 @@
 #include "cli/TreePrinter.h"
 
-#include "cli/Printable.h"
 #include "platform/Clock.h"
+#include "platform/Printable.h"
 
 namespace pallax {
 

@@ -1,8 +1,11 @@
 #include "host/LogSinks.h"
 
+#include "platform/Printable.h"
+
 #include <cerrno>
 #include <cstring>
 #include <syslog.h>
+#include <unistd.h>
 
 namespace pallax {
 
@@ -36,8 +39,16 @@ void SyslogSink::write(LogPriority priority, std::string_view text) {
     ::syslog(static_cast<int>(priority), "%.*s", length, text.data()); // NOLINT: syslog's way
 }
 
+StderrSink::StderrSink() : _isTerminal(::isatty(STDERR_FILENO) != 0) {}
+
 void StderrSink::write(LogPriority priority, std::string_view text) {
-    writeTo(stderr, priority, text);
+    if (!_isTerminal) {
+        writeTo(stderr, priority, text);
+        return;
+    }
+    std::string harmless;
+    appendPrintableLines(harmless, text);
+    writeTo(stderr, priority, harmless);
 }
 
 Result<std::unique_ptr<FileSink>, HostError> FileSink::create(const std::string& path) {

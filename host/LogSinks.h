@@ -29,10 +29,16 @@ private:
     std::string _identity; // syslog keeps a pointer to it
 };
 
-/// Lines on standard error.
+/// Lines on standard error. Where that is a terminal, what a modem's text could tell it to do is
+/// replaced; a file gets every byte.
 class StderrSink final : public LogSink {
 public:
+    StderrSink();
+    explicit StderrSink(bool isTerminal) : _isTerminal(isTerminal) {}
     void write(LogPriority priority, std::string_view text) override;
+
+private:
+    bool _isTerminal;
 };
 
 /// Lines in a file, which is emptied first. They are written through when the sink is destroyed

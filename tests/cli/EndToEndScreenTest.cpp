@@ -104,7 +104,7 @@ TEST_F(EndToEndScreen, CancelWritesNothing) {
 
 TEST_F(EndToEndScreen, AMissingSnapshotDirectoryGivesAnAlertAndTheViewerGoesOn) {
     configure(world.path("nowhere"));
-    const std::string command = std::string(PALLAX_PROGRAM) + " " + brief() +
+    const std::string command = doubles::programPath() + " " + brief() +
                                 " --speed max --log-level 3 2>" + world.path("log");
     PallaxTerminal terminal(world, {"-c", command}, {.program = "/bin/sh"});
     ASSERT_TRUE(terminal.shows("End of the recording"));

@@ -35,7 +35,7 @@ TEST_F(EndToEndTerminal, ResizingIsSafeAtAnyMoment) {
 TEST_F(EndToEndTerminal, ItIsSuspendedAndComesBack) {
     PallaxTerminal terminal(world, {"--norc", "--noprofile", "-i"}, {.program = "/bin/bash"});
     ASSERT_TRUE(terminal.shows("$"));
-    terminal.type(std::string(PALLAX_PROGRAM) + " " + changing() + " --speed 4\r");
+    terminal.type(doubles::programPath() + " " + changing() + " --speed 4\r");
     ASSERT_TRUE(terminal.shows("Process CO"));
     terminal.type("\x1a");
     ASSERT_TRUE(terminal.shows("Stopped"));
@@ -51,7 +51,7 @@ TEST_F(EndToEndTerminal, ItIsSuspendedAndComesBack) {
 }
 
 TEST_F(EndToEndTerminal, TheShellsTerminalStaysBlocking) {
-    const std::string command = std::string(PALLAX_PROGRAM) + " " + brief() +
+    const std::string command = doubles::programPath() + " " + brief() +
                                 " --speed max; "
                                 "sed -n 's/^flags:/flags/p' /proc/self/fdinfo/0";
     PallaxTerminal terminal(world, {"-c", command}, {.program = "/bin/sh"});
@@ -222,7 +222,7 @@ TEST_F(EndToEndTerminal, ATickClearsNothing) {
 }
 
 TEST_F(EndToEndTerminal, KeysComeFromTheTerminalWhenStandardInputIsTheRecording) {
-    const std::string command = std::string(PALLAX_PROGRAM) + " - --speed max < " + brief();
+    const std::string command = doubles::programPath() + " - --speed max < " + brief();
     PallaxTerminal terminal(world, {"-c", command}, {.program = "/bin/sh"});
     ASSERT_TRUE(terminal.shows("End of the recording"));
     terminal.type("\r");

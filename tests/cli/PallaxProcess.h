@@ -31,6 +31,10 @@ private:
     std::filesystem::path _folder;
 };
 
+/// The program under test: `pallax` as it was built, or what the environment's PALLAX_TEST_PROGRAM
+/// starts instead (`pallax` under a memory checker).
+std::string programPath();
+
 /// What a program in the world sees of the environment: its folders, UTC, and the world's own.
 std::vector<std::string> programEnvironment(const World& world);
 

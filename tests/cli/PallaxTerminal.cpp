@@ -33,7 +33,7 @@ winsize sizeOf(int columns, int rows) {
 PallaxTerminal::PallaxTerminal(const World& world, std::vector<std::string> arguments,
                                const Setup& setup)
     : _screen(setup.columns, setup.rows) {
-    arguments.insert(arguments.begin(), setup.program.empty() ? PALLAX_PROGRAM : setup.program);
+    arguments.insert(arguments.begin(), setup.program.empty() ? programPath() : setup.program);
     std::vector<std::string> environment = programEnvironment(world);
     environment.insert(environment.end(),
                        {"TERM=" + setup.type, "LC_ALL=" + setup.locale, "PS1=$ "});

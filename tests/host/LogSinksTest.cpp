@@ -35,6 +35,21 @@ TEST(FileSink, AFailureIsTold) {
     EXPECT_FALSE((*full)->flush());
 }
 
+TEST(StderrSink, OnATerminalNoTextIsACommand) {
+    testing::internal::CaptureStderr();
+    StderrSink(true).write(LogPriority::Warning, "name:\t\x1B]0;owned\x07\n\x9B"
+                                                 "31m \xC2\x9B gr\xC3\xBC\xC3\x9F");
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "<4>name:\t\xEF\xBF\xBD]0;owned\xEF\xBF\xBD\n"
+                                                      "\xEF\xBF\xBD"
+                                                      "31m \xEF\xBF\xBD gr\xC3\xBC\xC3\x9F\n");
+}
+
+TEST(StderrSink, InAFileEveryByteStays) {
+    testing::internal::CaptureStderr();
+    StderrSink(false).write(LogPriority::Warning, "\x1B[31m\xFF");
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "<4>\x1B[31m\xFF\n");
+}
+
 TEST(StderrSink, WritesLines) {
     testing::internal::CaptureStderr();
     StderrSink().write(LogPriority::Error, "No log generator technology works");

@@ -16,4 +16,7 @@ void appendValidUtf8(std::string& out, std::string_view text);
 /// could be taken for a command) is replaced.
 void appendPrintable(std::string& out, std::string_view text);
 
+/// The same for a text of several lines: ends of lines and tabulators stay.
+void appendPrintableLines(std::string& out, std::string_view text);
+
 } // namespace pallax

@@ -1,4 +1,4 @@
-#include "cli/Printable.h"
+#include "platform/Printable.h"
 
 #include "platform/Utf8.h"
 
@@ -30,6 +30,12 @@ void appendValidUtf8(std::string& out, std::string_view text) {
 
 void appendPrintable(std::string& out, std::string_view text) {
     appendCharacters(out, text, isControl);
+}
+
+void appendPrintableLines(std::string& out, std::string_view text) {
+    appendCharacters(out, text, [](char32_t codePoint) {
+        return isControl(codePoint) && codePoint != '\n' && codePoint != '\t';
+    });
 }
 
 } // namespace pallax

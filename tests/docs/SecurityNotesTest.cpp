@@ -1,0 +1,68 @@
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+#include <regex>
+#include <set>
+#include <string>
+
+namespace pallax {
+namespace {
+
+namespace fs = std::filesystem;
+
+std::string contentOf(const fs::path& path) {
+    std::ifstream file(path, std::ios::binary);
+    EXPECT_TRUE(file.is_open()) << path;
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
+/// Everything that `pattern` (with `parts` groups, joined by dots) finds in a text.
+std::set<std::string> found(const std::string& text, const std::regex& pattern, int parts) {
+    std::set<std::string> names;
+    for (std::sregex_iterator match(text.begin(), text.end(), pattern), end; match != end;
+         ++match) {
+        std::string name = (*match)[1];
+        for (int part = 2; part <= parts; ++part) {
+            name.append(".").append((*match)[static_cast<std::size_t>(part)]);
+        }
+        names.insert(name);
+    }
+    return names;
+}
+
+/// "Suite.Name" of every test in the source tree.
+std::set<std::string> allTests() {
+    const std::regex test(R"(TEST(?:_F|_P)?\(\s*(\w+),\s*(\w+)\s*\))");
+    std::set<std::string> names;
+    for (const auto& entry : fs::recursive_directory_iterator(PALLAX_SOURCE_DIR "/tests")) {
+        if (entry.path().extension() == ".cpp" || entry.path().extension() == ".h") {
+            names.merge(found(contentOf(entry.path()), test, 2));
+        }
+    }
+    return names;
+}
+
+TEST(SecurityNotes, EveryTestThatTheyNameExists) {
+    const std::regex quoted(R"(`(\w+)\.([A-Z0-9]\w+)`)");
+    const auto named = found(contentOf(PALLAX_SOURCE_DIR "/docs/security.md"), quoted, 2);
+    ASSERT_GT(named.size(), 20U);
+    const auto tests = allTests();
+    for (const std::string& name : named) {
+        EXPECT_TRUE(tests.contains(name)) << name;
+    }
+}
+
+TEST(SecurityNotes, EveryFuzzTargetIsNamed) {
+    const std::regex target(R"(pallax_fuzzer\((\w+) Fuzz)");
+    const std::string notes = contentOf(PALLAX_SOURCE_DIR "/docs/security.md");
+    const auto targets = found(contentOf(PALLAX_SOURCE_DIR "/fuzz/CMakeLists.txt"), target, 1);
+    ASSERT_GT(targets.size(), 10U);
+    for (const std::string& name : targets) {
+        EXPECT_NE(notes.find("`" + name + "`"), std::string::npos) << name;
+    }
+}
+
+} // namespace
+} // namespace pallax
