@@ -11,17 +11,17 @@ void encode(std::span<const MeasuredCell> cells, ByteBuffer& out) {
     constexpr std::size_t kCountOffset = 16;
     constexpr std::size_t kCellsStart = 168;
     constexpr std::size_t kRestOfCell = 12;
+    constexpr unsigned kParameterShift = 14;
+    constexpr unsigned kRscpShift = 21;
+    constexpr unsigned kSetShift = 29;
+    constexpr unsigned kSearchShift = 31;
     RecordWriter record(out, 0xD00A);
     record.padTo(kCellsStart);
     record.bits(kCountOffset, 1, 7, static_cast<unsigned>(cells.size()));
     for (const MeasuredCell& cell : cells) {
-        const std::size_t start = record.length();
-        record.u32(0);
-        record.bits(start, 0, 14, cell.uarfcn);
-        record.bits(start + 1, 6, 7, cell.cellParameter);
-        record.bits(start + 2, 5, 8, cell.filteredRscp);
-        record.bits(start + 3, 5, 2, static_cast<unsigned>(cell.set));
-        record.bits(start + 3, 7, 1, cell.inDetectedCellSearch ? 1 : 0);
+        record.u32(cell.uarfcn | cell.cellParameter << kParameterShift |
+                   cell.filteredRscp << kRscpShift | static_cast<unsigned>(cell.set) << kSetShift |
+                   (cell.inDetectedCellSearch ? 1U : 0U) << kSearchShift);
         record.skip(kRestOfCell);
     }
 }
@@ -32,14 +32,13 @@ void encode(std::span<const MeasuredCell> cells, ByteBuffer& out) {
 //                     (16), RSSI (16)
 void encode(std::span<const GsmNeighbour> cells, ByteBuffer& out) {
     constexpr std::size_t kCountOffset = 16;
+    constexpr unsigned kBandShift = 14;
+    constexpr unsigned kBsicValidShift = 15;
     RecordWriter record(out, 0xD00E);
     record.padTo(kCountOffset).u8(static_cast<unsigned>(cells.size()));
     for (const GsmNeighbour& cell : cells) {
-        const std::size_t start = record.length();
-        record.u16(0);
-        record.bits(start, 0, 14, cell.number);
-        record.bits(start + 1, 6, 1, cell.bandIndicator);
-        record.bits(start + 1, 7, 1, cell.bsicValid ? 1 : 0);
+        record.u16(cell.number | cell.bandIndicator << kBandShift |
+                   (cell.bsicValid ? 1U : 0U) << kBsicValidShift);
         record.u8(cell.ncc).u8(cell.bcc).u16(cell.arfcn).s16(cell.rssi_dbm);
     }
 }
