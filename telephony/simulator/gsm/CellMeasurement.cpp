@@ -14,19 +14,6 @@ unsigned unsignedLevel(int level_dbm) {
 
 } // namespace
 
-//   byte  width  0x5134, 26 bytes
-//   13    16     ARFCN
-//   15    16     BSIC
-//   17    16     cell identity
-void encode(const ServingIdentity& identity, ByteBuffer& out) {
-    constexpr std::size_t kLength = 26;
-    RecordWriter(out, 0x5134)
-        .u16(identity.arfcn)
-        .u16(identity.bsic)
-        .u16(identity.cellId)
-        .padTo(kLength);
-}
-
 //   byte  width  0x5137
 //   15    8      level of the serving cell, without its sign
 //   16    32     C1
@@ -34,7 +21,7 @@ void encode(const ServingIdentity& identity, ByteBuffer& out) {
 //   26    8      cell reselect hysteresis applied
 //   28    8      number of neighbours
 //   29    112    each neighbour: ARFCN (16), level (8), C1 (32), 7 bytes more
-void encode(const Measurement& measurement, ByteBuffer& out) {
+void encode(const CellMeasurement& measurement, ByteBuffer& out) {
     constexpr std::size_t kRestOfNeighbour = 7;
     RecordWriter record(out, 0x5137);
     record.u16(0).u8(unsignedLevel(measurement.level_dbm));
@@ -44,17 +31,6 @@ void encode(const Measurement& measurement, ByteBuffer& out) {
     for (const NeighbourLevel& cell : measurement.neighbours) {
         record.u16(cell.arfcn).u8(unsignedLevel(cell.level_dbm)).s32(cell.c1);
         record.skip(kRestOfNeighbour);
-    }
-}
-
-//   byte  width  0x51FF
-//   14    8      number of cells
-//   15    32     each cell: ARFCN (16), BSIC (8), a byte more
-void encode(const BsicList& list, ByteBuffer& out) {
-    RecordWriter record(out, 0x51FF);
-    record.u8(0).u8(static_cast<unsigned>(list.cells.size()));
-    for (const NeighbourBsic& cell : list.cells) {
-        record.u16(cell.arfcn).u8(cell.bsic).u8(0);
     }
 }
 

@@ -3,14 +3,6 @@
 
 namespace pallax::utran {
 
-//   byte  width  0xD0E0
-//   13    8      version
-//   14    8      mode
-void encode(RrcMode mode, ByteBuffer& out) {
-    constexpr unsigned kVersion = 1; // the only one that is understood
-    RecordWriter(out, 0xD0E0).u8(kVersion).u8(static_cast<unsigned>(mode));
-}
-
 //   byte  width  0xD0E2
 //   14    8      access restrictions
 //   15    8      URA identity

@@ -1,6 +1,7 @@
 #include "telephony/simulator/Measurement.h"
 #include "telephony/simulator/RecordWriter.h"
 #include "telephony/simulator/cdma/CdmaRecords.h"
+#include "telephony/simulator/cdma/Subpackets.h"
 
 #include <algorithm>
 #include <cmath>
@@ -8,19 +9,6 @@
 namespace pallax::cdma {
 
 namespace {
-
-//   byte  width  head of a record of subpackets
-//   14    8      number of subpackets
-//   17           subpackets, each with its number (8), a byte, and its size with this header (16)
-constexpr std::size_t kFirstSubpacket = 17;
-
-void putHead(RecordWriter& record, unsigned count) {
-    record.u8(1).u8(count).padTo(kFirstSubpacket);
-}
-
-RecordWriter& subpacket(RecordWriter& record, unsigned number, std::size_t size) {
-    return record.u8(number).u8(1).u16(static_cast<unsigned>(size));
-}
 
 /// In steps of 0.334 dB above -63.248 dBm.
 int rawGain(double level_dbm) {
@@ -85,49 +73,6 @@ void encode(const OneXStatus& status, ByteBuffer& out) {
     record.s16(whole(status.transmit_dbm * kTenths));
     putActiveSet(record, status.activeSet);
     subpacket(record, 4, kFingersSize).skip(kFingersSize - kHeader);
-}
-
-//   subpacket  byte  width  0x119D
-//   11         24    8      the frame is in error
-void encode(const TrafficFrame& frame, ByteBuffer& out) {
-    constexpr unsigned kDemodulation = 11;
-    constexpr std::size_t kSize = 28;
-    constexpr std::size_t kBeforeError = 20;
-    RecordWriter record(out, 0x119D);
-    putHead(record, 1);
-    subpacket(record, kDemodulation, kSize).skip(kBeforeError).u8(frame.inError ? 1 : 0).skip(3);
-}
-
-//   byte  width  0x134F
-//   13    8      version
-//   42    32     roaming indicator
-//   46    32     type of the system: 2 for 1x
-//   50    16     system identity
-//   52    16     network identity
-//   131   8      packet zone
-//   133   8      protocol revision
-//   184   16     base station
-void encode(const SystemIdentity& identity, ByteBuffer& out) {
-    constexpr unsigned kVersion = 2;
-    constexpr unsigned kOneX = 2;
-    constexpr std::size_t kRoamingOffset = 42;
-    constexpr std::size_t kZoneOffset = 131;
-    constexpr std::size_t kBaseStationOffset = 184;
-    constexpr std::size_t kRecordLength = 190;
-    RecordWriter(out, 0x134F)
-        .u8(kVersion)
-        .padTo(kRoamingOffset)
-        .u32(identity.roaming)
-        .u32(kOneX)
-        .u16(identity.systemId)
-        .u16(identity.networkId)
-        .padTo(kZoneOffset)
-        .u8(identity.packetZone)
-        .u8(0)
-        .u8(identity.protocolRevision)
-        .padTo(kBaseStationOffset)
-        .u16(identity.baseStation)
-        .padTo(kRecordLength);
 }
 
 } // namespace pallax::cdma
