@@ -47,11 +47,12 @@ constexpr const char* kServiceFooter = R"(Examples:
   pallax service --play drive.pcap
   pallax service --play drive.pcap --speed max --loop
   pallax service --simulate lte --seed 7
+  pallax service --simulate ifx --seconds 600 --speed max
   ssh phone modem-dump | pallax service --relay -
   pallax service --status
 
-Every client gets a channel of its own. A played recording begins anew for each; what is relayed
-goes to all as it comes, and the service ends with it. A client that is too slow loses packets and
+Every client gets a channel of its own. A recording or simulation begins anew for each; what is
+relayed goes to all as it comes, and the service ends with it. A client that is too slow loses packets and
 delays nobody; with --speed max it sets its own pace and loses nothing.)";
 
 void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
@@ -176,7 +177,9 @@ void addServicePlay(CLI::App& app, ServiceOptions& options) {
     CLI::Option* recording =
         app.add_option("--play", options.recording, "The recording to play to each client")
             ->type_name("RECORDING");
-    addPlay(app, options.play, recording);
+    addSpeed(app, options.play);
+    app.add_flag("--loop", options.play.loop, "Begin again at the recording's end")
+        ->needs(recording);
 }
 
 void addServiceSimulated(CLI::App& app, std::optional<SimulationOptions>& simulation) {
@@ -194,12 +197,14 @@ void addServiceRelay(CLI::App& app, std::string& relayed) {
            "--relay", take, "Pass on the live pcap stream of standard input (-) to every client")
         ->type_name("-")
         ->excludes("--play")
+        ->excludes("--speed") // the stream has its own
         ->excludes("--simulate");
 }
 
 void addServiceStatus(CLI::App& app, bool& status) {
     app.add_flag("--status", status, "Print what the running service serves, and end")
         ->excludes("--play")
+        ->excludes("--speed")
         ->excludes("--simulate")
         ->excludes("--relay");
 }

@@ -25,6 +25,8 @@ constexpr const char* kSimulateFooter = R"(Examples:
 
 The same technology, seed, rate and duration give the same file. An existing file is replaced.)";
 
+constexpr const char* kUntilWhen = "End after so many simulated seconds (default: never)";
+
 /// A whole number within bounds; CLI11's own takes "-1" for a large one.
 template <class Value>
 Value numberOf(const char* option, const std::string& text, Value least, Value most) {
@@ -61,15 +63,14 @@ CLI::Option* addRate(CLI::App& app, const std::function<void(unsigned)>& take) {
         ->type_name("N");
 }
 
-CLI::Option* addSeconds(CLI::App& app, SimulationOptions& simulation,
+CLI::Option* addSeconds(CLI::App& app, const std::function<void(std::chrono::seconds)>& take,
                         const std::string& description) {
     constexpr std::int64_t kMost = 366LL * 24 * 3600; // recordings have stamps until 2106
     return app
         .add_option_function<std::string>(
             "--seconds",
-            [&simulation](const std::string& text) {
-                simulation.duration =
-                    std::chrono::seconds(numberOf<std::int64_t>("--seconds", text, 1, kMost));
+            [take](const std::string& text) {
+                take(std::chrono::seconds(numberOf<std::int64_t>("--seconds", text, 1, kMost)));
             },
             description)
         ->type_name("N");
@@ -116,7 +117,9 @@ void addDemo(CLI::App& app, SimulationOptions& simulation, PlayOptions& play) {
         [&simulation](const RecordedTechnology* technology) { simulation.technology = technology; },
         "What the simulated modem speaks (default: lte)");
     addCommon(app, simulation);
-    addSeconds(app, simulation, "End after so many simulated seconds (default: never)");
+    addSeconds(
+        app, [&simulation](std::chrono::seconds duration) { simulation.duration = duration; },
+        kUntilWhen);
     addSpeed(app, play);
     app.footer(kDemoFooter);
 }
@@ -129,7 +132,10 @@ void addSimulate(CLI::App& app, SimulateOptions& options) {
         },
         "What the simulated modem speaks")
         ->required();
-    addSeconds(app, options.simulation, "How much time the recording covers")->required();
+    addSeconds(
+        app, [&options](std::chrono::seconds duration) { options.simulation.duration = duration; },
+        "How much time the recording covers")
+        ->required();
     addCommon(app, options.simulation);
     app.add_option("-o,--output", options.file, "Where to; - is standard output")
         ->required()
@@ -149,6 +155,9 @@ CLI::Option* addServiceSimulation(CLI::App& app, std::optional<SimulationOptions
     };
     addSeed(app, [chosen](std::uint64_t seed) { chosen().seed = seed; })->needs(technology);
     addRate(app, [chosen](unsigned rate) { chosen().packetsPerSecond = rate; })->needs(technology);
+    addSeconds(
+        app, [chosen](std::chrono::seconds duration) { chosen().duration = duration; }, kUntilWhen)
+        ->needs(technology);
     return technology;
 }
 

@@ -26,7 +26,7 @@ const RecordedTechnology* usualSimulatedTechnology();
 void addDemo(CLI::App& app, SimulationOptions& simulation, PlayOptions& play);
 /// `TECHNOLOGY --seconds N --seed --rate -o FILE`.
 void addSimulate(CLI::App& app, SimulateOptions& options);
-/// `--simulate TECHNOLOGY --seed --rate`; the first of them.
+/// `--simulate TECHNOLOGY --seed --rate --seconds`; the first of them.
 CLI::Option* addServiceSimulation(CLI::App& app, std::optional<SimulationOptions>& simulation);
 
 } // namespace pallax

@@ -3,6 +3,7 @@
 #include "platform/Refusal.h"
 #include "platform/Utf8.h"
 
+#include <algorithm>
 #include <array>
 #include <bit>
 #include <limits>
@@ -62,25 +63,26 @@ void appendUtf16(std::string& out, char32_t codePoint) {
 }
 
 std::string encodedText(std::string_view text) {
+    const auto isAscii = [](char letter) {
+        return static_cast<unsigned char>(letter) <= kLastAscii;
+    };
+    std::string out;
+    if (std::all_of(text.begin(), text.end(), isAscii)) {
+        appendCounted(out, kAscii, text.size());
+        out += text;
+        return out;
+    }
     std::string units;
-    bool ascii = true;
     for (std::size_t at = 0; at < text.size();) {
         const Utf8CodePoint next = utf8At(text, at);
         if (next.size == 0) {
             refuse(0, "a text that is no UTF-8");
         }
-        ascii = ascii && next.value <= kLastAscii;
         appendUtf16(units, next.value);
         at += next.size;
     }
-    std::string out;
-    if (ascii) {
-        appendCounted(out, kAscii, text.size());
-        out += text;
-    } else {
-        appendCounted(out, kUtf16, units.size() / 2);
-        out += units;
-    }
+    appendCounted(out, kUtf16, units.size() / 2);
+    out += units;
     return out;
 }
 

@@ -4,6 +4,7 @@
 #include "platform/Utf8.h"
 #include "platform/XmlMarkupCheck.h"
 
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
@@ -16,8 +17,21 @@ constexpr std::string_view kOpening = "<?xml version=\"1.0\" encoding=\"UTF-8\"?
                                       "<plist version=\"1.0\">\n";
 constexpr std::string_view kClosing = "</plist>\n";
 
+/// Stands in XML as it is, whatever comes before and after it.
+bool isPlain(char letter) {
+    return letter >= ' ' && letter <= '~' && letter != '&' && letter != '<' && letter != '>';
+}
+
 void appendEscaped(std::string& out, std::string_view text) {
     for (std::size_t at = 0; at < text.size();) {
+        const auto rest = text.substr(at);
+        const auto plain = static_cast<std::size_t>(
+            std::find_if_not(rest.begin(), rest.end(), isPlain) - rest.begin());
+        if (plain > 0) {
+            out += rest.substr(0, plain);
+            at += plain;
+            continue;
+        }
         const Utf8CodePoint next = utf8At(text, at);
         if (next.size == 0) {
             refuse(0, "a text that is no UTF-8");

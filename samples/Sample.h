@@ -32,16 +32,15 @@ std::vector<SamplePacket> gsmAttachPackets();
 /// behind a hill, neighbours that come and go.
 std::vector<SamplePacket> umtsDrivePackets();
 
-/// A minute of a CDMA phone in a car: idle on 1x, a call over a handover with frames in error, then
-/// a data session over EV-DO.
+/// A minute of the simulated CDMA phone: a voice call on 1x, then a data session over EV-DO.
 std::vector<SamplePacket> cdmaDrivePackets();
 
-/// Two minutes of an LTE phone in a car: idle and connected mode, handovers, neighbours of every
-/// technology.
+/// Two minutes of the simulated LTE phone: idle and connected mode, cell changes, neighbours of
+/// every technology.
 std::vector<SamplePacket> lteDrivePackets();
 
-/// Two minutes of a UTRAN phone in a car: a data session on its own channel that ends over the
-/// shared and the paging states, two cell changes, neighbours that come and go.
+/// Two minutes of the simulated UTRAN phone: data sessions, the states that save the battery
+/// between them, cell changes.
 std::vector<SamplePacket> utranDrivePackets();
 
 /// Half a minute of an IFX phone on foot: a cell change, a call with a handover, neighbours; a

@@ -5,6 +5,7 @@
 #include "telephony/RecordingSource.h"
 #include "telephony/Relay.h"
 #include "telephony/ServiceStatus.h"
+#include "telephony/StreamOpening.h"
 #include "telephony/StreamSource.h"
 #include "telephony/TelephonyServer.h"
 #include "telephony/simulator/SimulatedSource.h"
@@ -52,7 +53,8 @@ Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueu
                        },
                        nullptr};
     }
-    auto recording = openKnownRecording(options.recording);
+    const auto open = [&options] { return openKnownRecording(options.recording); };
+    auto recording = options.relay ? openStream({open, complain}) : open();
     if (!recording) {
         return recording.error();
     }

@@ -50,13 +50,6 @@ RecordWriter& RecordWriter::bits(std::size_t offset, unsigned bit, unsigned widt
     return *this;
 }
 
-RecordWriter& RecordWriter::put(std::uint32_t value, std::size_t width) {
-    const std::size_t offset = _out.size();
-    _out.resize(offset + width);
-    store(_out, offset, value, width);
-    return *this;
-}
-
 void stampRecord(ByteBuffer& record, std::uint64_t microseconds) {
     if (record.size() < RecordWriter::kPrefixLength + RecordWriter::kHeaderLength) {
         return;

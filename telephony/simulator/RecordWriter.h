@@ -38,7 +38,15 @@ public:
     RecordWriter& bits(std::size_t offset, unsigned bit, unsigned width, unsigned value);
 
 private:
-    RecordWriter& put(std::uint32_t value, std::size_t width);
+    RecordWriter& put(std::uint32_t value, std::size_t width) {
+        constexpr unsigned kBitsPerByte = 8;
+        const std::size_t offset = _out.size();
+        _out.resize(offset + width);
+        for (std::size_t index = 0; index < width; ++index, value >>= kBitsPerByte) {
+            _out[offset + index] = static_cast<std::uint8_t>(value);
+        }
+        return *this;
+    }
 
     ByteBuffer& _out;
 };

@@ -21,7 +21,7 @@ struct Hill {
 };
 constexpr std::array<Hill, 3> kHills = {{{330, 260}, {2900, 420}, {5600, 300}}};
 /// Over so many metres the shadow comes and goes.
-constexpr double kSlopeM = 60;
+constexpr double kSlopeM = 90;
 
 double distance(const PlanePoint& a, const PlanePoint& b) {
     return std::sqrt((a.x_m - b.x_m) * (a.x_m - b.x_m) + (a.y_m - b.y_m) * (a.y_m - b.y_m));

@@ -48,9 +48,9 @@ TEST_F(EndToEnd, DecodeOfTheCDMASampleShowsEveryRowFilled) {
     EXPECT_EQ(end.err, "");
     EXPECT_EQ(end.out.find(":\"\""), std::string::npos) << end.out;
     const auto display = linesOf(end.out).at(0);
-    EXPECT_EQ(display["1x"]["Frame Error Rate"], "2.36% (old)");
-    EXPECT_EQ(display["EV-DO"]["Active Set"]["1;4"], "-9.46 dB");
-    EXPECT_EQ(display["Data Rates"]["Forward Link"], "633.00 kbps");
+    EXPECT_EQ(display["1x"]["Frame Error Rate"], "1.73% (old)");
+    EXPECT_EQ(display["EV-DO"]["Active Set"]["0;118"], "-3.98 dB");
+    EXPECT_EQ(display["Data Rates"]["Forward Link"], "2264.00 kbps");
 }
 
 TEST_F(EndToEnd, DecodeOfTheObjectStreamShowsItsNestedObjects) {

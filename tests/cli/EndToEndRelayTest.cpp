@@ -150,6 +150,50 @@ TEST_F(EndToEndRelay, AStreamThatTurnsToGarbageIsAFailure) {
     EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
 }
 
+/// A stream that the test begins when it likes.
+class EndToEndRelayBegins : public EndToEnd {
+protected:
+    EndToEndRelayBegins() {
+        EXPECT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+        both = Descriptor(::open(pipe.c_str(), O_RDWR | O_CLOEXEC));
+        service.emplace(world, std::vector<std::string>{"service", "--relay", "-"}, pipe);
+    }
+
+    std::string pipe = world.path("device");
+    Descriptor both; // so that nobody waits, and the stream does not end
+    std::optional<PallaxProcess> service;
+};
+
+TEST_F(EndToEndRelayBegins, AStreamWhoseHeaderDoesNotComeHasStalledAndMayGoOn) {
+    const auto says = [this](const char* text) {
+        return service->says(text) || service->says(text); // twice as long, for a stall takes 10 s
+    };
+    EXPECT_TRUE(says("pallax: The stream has stalled: no header for 10 s.\n"));
+    EXPECT_TRUE(world.sockets().empty()) << "nobody knows the technology yet";
+    auto writer = RecordingWriter::create(pipe, kGsmLinkType);
+    ASSERT_TRUE(writer);
+    auto device = std::move(writer).value();
+    EXPECT_TRUE(says("pallax: The stream goes on after 1"));
+    EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
+    EXPECT_EQ(device->write(kSampleStart, registration(0)), std::nullopt);
+    device.reset();
+    both.reset();
+    EXPECT_EQ(service->wait(), 0);
+    EXPECT_TRUE(service->err().ends_with("pallax: The stream has ended. 1 packets were relayed.\n"))
+        << service->err();
+}
+
+TEST_F(EndToEndRelayBegins, AStreamThatEndsBeforeItsHeaderOrIsNoneIsAFailure) {
+    both.reset();
+    EXPECT_EQ(service->wait(), 1);
+    EXPECT_EQ(service->err(), "pallax: standard input is empty.\n");
+    std::ofstream(world.path("garbage"), std::ios::binary) << std::string(4096, '\xEE');
+    const Run garbage = run({"service", "--relay", "-"}, world.path("garbage"));
+    EXPECT_EQ(garbage.status, 1);
+    EXPECT_EQ(garbage.err,
+              "pallax: standard input is no recording: it is neither pcap nor pcapng.\n");
+}
+
 TEST_F(EndToEndRelay, TheStatusTellsWhatRuns) {
     const Run idle = run({"service", "--status"});
     EXPECT_EQ(idle.status, 0);

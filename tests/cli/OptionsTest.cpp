@@ -142,7 +142,13 @@ TEST(Options, ServiceSimulatesAModem) {
     EXPECT_EQ(options.simulation->seed, 18446744073709551615U);
     EXPECT_EQ(options.simulation->packetsPerSecond, 50U);
     EXPECT_EQ(options.recording, "");
+    EXPECT_EQ(options.simulation->duration, std::nullopt);
+    EXPECT_EQ(options.play.speed, 1.0);
     EXPECT_EQ(ended({"service", "--simulate", "lte", "--play", "a"}).status, kExitWrongUsage);
+    const auto brief = parsed<ServiceOptions>(
+        {"service", "--simulate", "ifx", "--seconds", "60", "--speed", "max"});
+    EXPECT_EQ(brief.simulation->duration, std::chrono::seconds(60));
+    EXPECT_EQ(brief.play.speed, PlayOptions::kAsFastAsTaken);
 }
 
 TEST(Options, DemoBrowsesASimulatedModemOfLteUnlessAnotherIsNamed) {
@@ -196,6 +202,13 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
               "pallax: --seconds is required (pallax --help tells more)\n");
     EXPECT_EQ(sentence({"service", "--seed", "3"}),
               "pallax: --seed requires --simulate (pallax --help tells more)\n");
+    EXPECT_EQ(sentence({"service", "--play", "a", "--seconds", "3"}),
+              "pallax: --seconds requires --simulate (pallax --help tells more)\n");
+    EXPECT_EQ(sentence({"service", "--relay", "-", "--speed", "2"}),
+              "pallax: --relay excludes --speed (pallax --help tells more)\n");
+    EXPECT_EQ(sentence({"service", "--speed", "2"}),
+              "pallax: the service needs --play, --simulate, --relay or --status (pallax --help "
+              "tells more)\n");
 }
 
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {

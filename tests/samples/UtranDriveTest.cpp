@@ -87,8 +87,8 @@ TEST_F(UtranDrive, ItBringsTheCellMonitorInBothForms) {
                    std::string(data.begin() + kPayload, data.end()).starts_with(text);
         });
     };
-    EXPECT_EQ(startsWith("<?xml"), 12);
-    EXPECT_EQ(startsWith("bplist"), 12);
+    EXPECT_EQ(startsWith("<?xml"), 1);
+    EXPECT_EQ(startsWith("bplist"), 4);
 }
 
 } // namespace

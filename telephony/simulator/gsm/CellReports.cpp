@@ -37,7 +37,8 @@ void reportMeasurement(const Scenario& scenario, Random& random, ByteBuffer& out
     }
     const int level_dbm = levelOf(layer, layer.camped(), random);
     const int c1 = std::max(level_dbm - kLeastAccessDbm, 0);
-    encode(Measurement{level_dbm, c1, c1 + kReselectOffsetDb, true, std::span(cells.data(), count)},
+    encode(CellMeasurement{level_dbm, c1, c1 + kReselectOffsetDb, true,
+                           std::span(cells.data(), count)},
            out);
 }
 

@@ -24,14 +24,14 @@ struct NeighbourLevel {
     int level_dbm;
     std::int32_t c1;
 };
-struct Measurement {
+struct CellMeasurement {
     int level_dbm;
     std::int32_t c1; ///< read as a quality, too
     std::int32_t c2;
     bool hysteresisApplied;
     std::span<const NeighbourLevel> neighbours;
 };
-void encode(const Measurement& measurement, ByteBuffer& out);
+void encode(const CellMeasurement& measurement, ByteBuffer& out);
 
 /// 0x51FF: the colour codes of the neighbours.
 struct NeighbourBsic {

@@ -1,11 +1,11 @@
 #include "telephony/simulator/ifx/IfxModem.h"
 
-#include "platform/PropertyListCodec.h"
 #include "telephony/simulator/Measurement.h"
+#include "telephony/simulator/ifx/Picture.h"
 
 #include <algorithm>
-#include <stdexcept>
-#include <string>
+#include <array>
+#include <optional>
 
 namespace pallax {
 
@@ -16,106 +16,91 @@ using Phase = Activity::Phase;
 constexpr double kNoiseDb = 0.6;
 constexpr int kLeastAccessDbm = -105;
 
-/// The modem wraps what has a unit or a name into a dictionary of its own.
-PropertyList wrapped(const char* key, std::string value) {
-    return Dictionary{{key, std::move(value)}};
-}
-
-PropertyList levelOf(int level_dbm) {
-    std::string text = std::to_string(level_dbm);
-    text.append(" dBm");
-    return wrapped("Value", std::move(text));
-}
-
-/// "3,5": network and base station colour code.
-std::string bsicOf(const Cell& cell) {
+ifx::ColourCode bsicOf(const Cell& cell) {
     constexpr unsigned kColours = 8;
-    std::string text = std::to_string(cell.code / kColours % kColours);
-    text.append(",").append(std::to_string(cell.code % kColours));
-    return text;
+    return {cell.code / kColours % kColours, cell.code % kColours};
 }
 
-const char* stateOf(const Activity& activity) {
+ifx::RrState stateOf(const Activity& activity) {
     switch (activity.phase()) {
     case Phase::Off:
-        return "Off";
+        return ifx::RrState::Off;
     case Phase::Searching:
-        return "Cell Selection";
+        return ifx::RrState::Selection;
     case Phase::Registering:
     case Phase::Updating:
     case Phase::Connecting:
-        return "Connection Establishment";
+        return ifx::RrState::Establishment;
     case Phase::Connected:
-        return "Dedicated";
+        return ifx::RrState::Dedicated;
     case Phase::Releasing:
-        return "Connection Release";
+        return ifx::RrState::Release;
     case Phase::Idle:
         break;
     }
-    return "Idle";
+    return ifx::RrState::Idle;
 }
 
-PropertyList servingCell(const Scenario& scenario, Random& random) {
+ifx::ServingCell servingCell(const Scenario& scenario, Random& random) {
     const RadioLayer& layer = scenario.serving();
     const Cell& cell = layer.campedCell();
     const int level_dbm = whole(measured(layer.campedLevel_dbm(), kNoiseDb, random));
-    return Dictionary{{"ARFCN", std::to_string(cell.channel)},
-                      {"BSIC", bsicOf(cell)},
-                      {"Rx Level", levelOf(level_dbm)},
-                      {"C1", std::to_string(level_dbm - kLeastAccessDbm)},
-                      {"Area", Dictionary{{"LAC", std::to_string(cell.area)},
-                                          {"Cell ID", std::to_string(cell.identity)}}}};
+    return {cell.channel, bsicOf(cell), level_dbm, level_dbm - kLeastAccessDbm,
+            cell.area,    cell.identity};
 }
 
-/// A header, then the cells; the BSIC of a weak one is not read, and then its channel stands
-/// alone.
-PropertyList neighbourCells(const Scenario& scenario, Random& random) {
+using Neighbours = std::array<ifx::NeighbourCell, ifx::Picture::kMostNeighbours>;
+
+/// The BSIC of a weak cell is not read.
+std::size_t neighbourCells(const Scenario& scenario, Random& random, Neighbours& cells) {
     constexpr int kReadableDbm = -98;
-    constexpr std::size_t kMost = 6;
     const RadioLayer& layer = scenario.serving();
     const auto heard = layer.neighbours();
-    Array list = {"ARFCN, BSIC, Rx Level"};
-    for (const std::size_t index : heard.first(std::min(heard.size(), kMost))) {
+    std::size_t count = 0;
+    for (const std::size_t index : heard.first(std::min(heard.size(), cells.size()))) {
         const Cell& cell = layer.cells()[index];
         const int level_dbm = whole(measured(layer.level_dbm(index), kNoiseDb, random));
-        if (level_dbm < kReadableDbm) {
-            list.push_back(wrapped("ARFCN", std::to_string(cell.channel)));
-        } else {
-            list.emplace_back(Dictionary{{"ARFCN", std::to_string(cell.channel)},
-                                         {"BSIC", bsicOf(cell)},
-                                         {"Rx Level", levelOf(level_dbm)}});
-        }
+        cells[count++] = {cell.channel, level_dbm >= kReadableDbm, bsicOf(cell), level_dbm};
     }
-    return list;
+    return count;
 }
 
+using Hopping = std::array<unsigned, 4>;
+
 /// Nothing while idle.
-PropertyList dedicatedChannel(const Scenario& scenario, Random& random) {
+std::optional<ifx::DedicatedChannel> dedicatedChannel(const Scenario& scenario, Random& random,
+                                                      Hopping& hopping) {
     const Activity& activity = scenario.activity();
     if (!activity.isConnected() && activity.phase() != Phase::Connecting) {
-        return Dictionary{};
+        return std::nullopt;
     }
     constexpr double kPathToPowerDb = -58;
     constexpr double kLeastPowerDbm = 5;
     constexpr double kMostPowerDbm = 33;
+    constexpr double kNearDbm = -75;
+    constexpr int kWorstQuality = 7;
     const RadioLayer& layer = scenario.serving();
     const double below_db = layer.total_dbm() - layer.campedLevel_dbm();
     const double power_dbm =
         std::clamp(kPathToPowerDb - layer.campedLevel_dbm(), kLeastPowerDbm, kMostPowerDbm);
-    const int quality = std::clamp(whole(below_db + random.normal() / 2), 0, 7);
-    Dictionary channel{{"Channel", wrapped("Type", activity.isConnected() ? "TCH/F" : "SDCCH/8")},
-                       {"Time Slot", activity.isConnected() ? "3" : "1"},
-                       {"Timing Advance", std::to_string(layer.campedLevel_dbm() > -75 ? 1 : 2)},
-                       {"Rx Quality", std::to_string(quality)},
-                       {"Tx Power", levelOf(whole(power_dbm))}};
+    const int quality = std::clamp(whole(below_db + random.normal() / 2), 0, kWorstQuality);
+    ifx::DedicatedChannel channel{ifx::ChannelType::Signalling,
+                                  1,
+                                  layer.campedLevel_dbm() > kNearDbm ? 1U : 2U,
+                                  static_cast<unsigned>(quality),
+                                  whole(power_dbm),
+                                  {}};
     if (activity.isConnected()) {
+        constexpr unsigned kTrafficSlot = 3;
         constexpr unsigned kHoppingDistance = 9;
-        Array hopping = {"MAIO 3, HSN 17"};
-        for (unsigned step = 0; step < 4; ++step) {
-            hopping.emplace_back(
-                std::to_string(layer.campedCell().channel + step * kHoppingDistance));
+        unsigned arfcn = layer.campedCell().channel;
+        for (unsigned& each : hopping) {
+            each = arfcn;
+            arfcn += kHoppingDistance;
         }
-        channel.set(Text::fixed("Hopping"), std::move(hopping));
+        channel.type = ifx::ChannelType::Traffic;
+        channel.timeSlot = kTrafficSlot;
+        channel.hopping = hopping;
     }
     return channel;
 }
@@ -138,39 +123,21 @@ ScenarioPlan IfxModem::plan() {
     return plan;
 }
 
-PropertyList IfxModem::picture(const Scenario& scenario, Random& random) {
-    const PropertyList registered =
-        scenario.activity().isRegistered()
-            ? PropertyList(Dictionary{{"Name", "Sample Net"}, {"MCC", "262"}, {"MNC", "42"}})
-            : PropertyList("No");
-    return Dictionary{
-        {"Network", Dictionary{{"Registered", registered}}},
-        {"RR", Dictionary{{"State", wrapped("Name", stateOf(scenario.activity()))}}},
-        {"Serving Cell", servingCell(scenario, random)},
-        {"Neighbour Cells", neighbourCells(scenario, random)},
-        {"Dedicated Channel", dedicatedChannel(scenario, random)},
-    };
-}
-
 /// Nothing: every message tells everything.
 void IfxModem::observe(const Scenario& /*scenario*/, RecordQueue& /*queue*/) {}
 
 void IfxModem::report(const Scenario& scenario, Random& random, ByteBuffer& out) {
     constexpr unsigned kFormTurn = 8;
-    const PropertyList object = picture(scenario, random);
-    if (++_turn % kFormTurn != 0) {
-        auto bytes = serializeBinary(object);
-        if (!bytes) {
-            throw std::logic_error(bytes.error().reason);
-        }
-        out = std::move(bytes).value();
-        return;
-    }
-    const auto text = serializeXml(object);
-    if (!text) {
-        throw std::logic_error(text.error().reason);
-    }
-    out.assign(text->begin(), text->end());
+    Neighbours neighbours; // of which only those that are heard are written
+    Hopping hopping{};
+    ifx::Picture picture{};
+    picture.isRegistered = scenario.activity().isRegistered();
+    picture.state = stateOf(scenario.activity());
+    picture.serving = servingCell(scenario, random);
+    const std::size_t heard = neighbourCells(scenario, random, neighbours);
+    picture.neighbours = std::span(neighbours).first(heard);
+    picture.dedicated = dedicatedChannel(scenario, random, hopping);
+    ifx::encode(picture, ++_turn % kFormTurn == 0 ? ListForm::Xml : ListForm::Binary, out);
 }
 
 } // namespace pallax

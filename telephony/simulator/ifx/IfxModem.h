@@ -1,6 +1,5 @@
 #pragma once
 
-#include "platform/PropertyList.h"
 #include "telephony/simulator/Modem.h"
 
 namespace pallax {
@@ -14,9 +13,6 @@ public:
     void observe(const Scenario& scenario, RecordQueue& queue) override;
     void report(const Scenario& scenario, Random& random, ByteBuffer& out) override;
     bool sendsRecords() const override { return false; }
-
-    /// What the next message holds: strings, arrays and dictionaries only.
-    static PropertyList picture(const Scenario& scenario, Random& random);
 
 private:
     unsigned _turn = 0;

@@ -22,23 +22,48 @@ double numberOf(const std::string& shown) {
 
 TEST(CdmaRecords, TheEvdoStatusIsShownAsEncoded) {
     EXPECT_TRUE(rc::check([] {
+        const auto band = oneOf<unsigned>({{0, "800 MHz cellular band [0]"},
+                                           {1, "1.8 to 2.0GHz PCS band [1]"},
+                                           {12, "800 MHz European PAMR band [12]"}});
         const cdma::EvdoStatus status{
-            below(2048),        1,          between(-128, 128),         between(-128, 128),
-            between(-128, 128), below(512), cdma::EvdoState::Connected, cdma::EvdoSession::Open,
+            below(2048),        band.number, between(-128, 128),         between(-128, 128),
+            between(-128, 128), below(512),  cdma::EvdoState::Connected, cdma::EvdoSession::Open,
             below(1U << 24U),   below(256)};
         DecodedDisplay decoded("cdma");
         feedEncoded(decoded, status);
         const auto shown = [&](const char* key) { return decoded.text("EV-DO", key); };
         RC_ASSERT(shown("Channel") == text(status.channel));
-        RC_ASSERT(shown("Band Class") == "1.8 to 2.0GHz PCS band [1]");
+        RC_ASSERT(shown("Band Class") == band.label);
         RC_ASSERT(shown("Receive AGC 0") == formatText("%+d dBm", {status.receive0_dbm}));
         RC_ASSERT(shown("Receive AGC 1") == formatText("%+d dBm", {status.receive1_dbm}));
         RC_ASSERT(shown("Transmit AGC") == formatText("%+d dBm", {status.transmit_dbm}));
         RC_ASSERT(shown("Serving PN Offset") == text(status.servingPn) + " × 64chips");
-        RC_ASSERT(shown("Device State") == "Connected [5]");
-        RC_ASSERT(shown("Session State") == "Open [4]");
         RC_ASSERT(shown("UATI24") == formatText("0x%06x", {static_cast<int>(status.uati24)}));
         RC_ASSERT(shown("Color Code") == text(status.colorCode));
+    }));
+}
+
+TEST(CdmaRecords, TheEvdoStatesAreShownAsEncoded) {
+    EXPECT_TRUE(rc::check([] {
+        using cdma::EvdoSession;
+        using cdma::EvdoState;
+        const auto state = oneOf<EvdoState>({{EvdoState::Inactive, "Inactive [0]"},
+                                             {EvdoState::Acquisition, "Acquisition [1]"},
+                                             {EvdoState::Sync, "Sync [2]"},
+                                             {EvdoState::Idle, "Idle [3]"},
+                                             {EvdoState::Access, "Access [4]"},
+                                             {EvdoState::Connected, "Connected [5]"}});
+        const auto session =
+            oneOf<EvdoSession>({{EvdoSession::Closed, "Closed [0]"},
+                                {EvdoSession::AmpSetup, "AMP setup [1]"},
+                                {EvdoSession::PhoneNegotiates, "AT-initiated neg [2]"},
+                                {EvdoSession::NetworkNegotiates, "Initiated neg [3]"},
+                                {EvdoSession::Open, "Open [4]"}});
+        DecodedDisplay decoded("cdma");
+        feedEncoded(decoded, cdma::EvdoStatus{466, 0, -80, -82, 4, 168, state.number,
+                                              session.number, 0x0A42F7, 63});
+        RC_ASSERT(decoded.text("EV-DO", "Device State") == state.label);
+        RC_ASSERT(decoded.text("EV-DO", "Session State") == session.label);
     }));
 }
 
@@ -83,7 +108,6 @@ TEST(CdmaRecords, TheOneXStatusIsShownAsEncoded) {
         feedEncoded(decoded, status);
         const PropertyList& section = decoded.section("1x");
         const DictionaryRef keys = section.dictionary();
-        RC_ASSERT(decoded.text("1x", "Device State") == "Traffic [8]");
         RC_ASSERT(DecodedDisplay::textIn(*keys->find("Receiver 0"), "Channel") ==
                   text(status.channel));
         const auto level = [&](const char* receiver) {
@@ -102,6 +126,21 @@ TEST(CdmaRecords, TheOneXStatusIsShownAsEncoded) {
             shown.erase(0, isReference ? kReference.size() : 0);
             RC_ASSERT(std::abs(numberOf(shown) - list[index].part_db) < kRoundingDb);
         }
+    }));
+}
+
+TEST(CdmaRecords, TheOneXStateIsShownAsEncoded) {
+    EXPECT_TRUE(rc::check([] {
+        using cdma::OneXState;
+        const auto state = oneOf<OneXState>({{OneXState::Inactive, "Inactive [0]"},
+                                             {OneXState::Acquisition, "Acquisition [3]"},
+                                             {OneXState::Sync, "Sync [4]"},
+                                             {OneXState::Paging, "Paging [6]"},
+                                             {OneXState::Sleep, "Slotted mode sleep state [7]"},
+                                             {OneXState::Traffic, "Traffic [8]"}});
+        DecodedDisplay decoded("cdma");
+        feedEncoded(decoded, cdma::OneXStatus{state.number, 0, 384, -80, -82, 4, pilots(2)});
+        RC_ASSERT(decoded.text("1x", "Device State") == state.label);
     }));
 }
 

@@ -1,8 +1,4 @@
-#include "tests/telephony/simulator/SimulatedPhone.h"
-
-#include <algorithm>
-#include <cstdlib>
-#include <functional>
+#include "tests/telephony/simulator/Drives.h"
 
 // That records of GSM/UMTS, UTRAN, CDMA and IFX agree with each other; LTE has a test of its own.
 
@@ -11,36 +7,14 @@ namespace {
 
 using std::chrono::seconds;
 
-constexpr std::uint64_t kSeeds = PALLAX_DRIVES;
-/// Few packets a second, for every one is decoded and looked at; the drive is the same.
 constexpr unsigned kRate = 5;
-
-/// Calls `check` after each packet of many drives, with its code (0 of an object stream).
-void inEveryDrive(std::string_view technology, seconds duration,
-                  const std::function<void(const DecodedDisplay&, std::uint32_t)>& check) {
-    for (std::uint64_t seed = 0; seed < kSeeds && !testing::Test::HasFailure(); ++seed) {
-        SCOPED_TRACE("seed " + std::to_string(seed));
-        DecodedDisplay decoded(technology);
-        SimulationOptions options = simulationOf(technology, seed, duration);
-        options.packetsPerSecond = kRate;
-        Simulation simulation(options);
-        while (const auto packet = simulation.next()) {
-            decoded.feed(packet->data);
-            check(decoded,
-                  technology == "ifx"
-                      ? 0
-                      : LogPacketGetLogCode(LogRecord(LogPacketStripPrefix(packet->data))));
-        }
-    }
-}
-
-bool contains(const std::vector<std::string>& list, const std::string& text) {
-    return std::find(list.begin(), list.end(), text) != list.end();
-}
 
 TEST(Consistency, TheActiveUmtsCellIsInNoNeighbourList) {
     std::string cellId;
-    inEveryDrive("gsm", seconds(60), [&](const DecodedDisplay& decoded, std::uint32_t code) {
+    inEveryDrive({"gsm", seconds(60), kRate}, [&](const DriveMoment& moment) {
+        const DecodedDisplay& decoded = moment.decoded;
+        const std::uint32_t code = moment.code;
+
         const auto active = decoded.texts("Active Set", "Scrambling Code");
         EXPECT_LE(active.size(), 1U);
         const std::string state = decoded.text("GSM RR Info", "RR State");
@@ -63,7 +37,10 @@ TEST(Consistency, TheActiveUmtsCellIsInNoNeighbourList) {
 }
 
 TEST(Consistency, TheServingGsmCellIsNotItsOwnNeighbour) {
-    inEveryDrive("gsm", seconds(60), [](const DecodedDisplay& decoded, std::uint32_t code) {
+    inEveryDrive({"gsm", seconds(60), kRate}, [](const DriveMoment& moment) {
+        const DecodedDisplay& decoded = moment.decoded;
+        const std::uint32_t code = moment.code;
+
         const std::string serving = decoded.text("GSM Serving Cell", "ARFCN");
         if (code == 0x5137) {
             EXPECT_NE(serving, "(absent)");
@@ -75,7 +52,10 @@ TEST(Consistency, TheServingGsmCellIsNotItsOwnNeighbour) {
 }
 
 TEST(Consistency, OneUtranCellIsActiveAndServes) {
-    inEveryDrive("utran", seconds(60), [](const DecodedDisplay& decoded, std::uint32_t code) {
+    inEveryDrive({"utran", seconds(60), kRate}, [](const DriveMoment& moment) {
+        const DecodedDisplay& decoded = moment.decoded;
+        const std::uint32_t code = moment.code;
+
         const auto sets = decoded.texts("Neighbor Cell List", "Status");
         const auto cells = decoded.texts("Neighbor Cell List", "Cell ID");
         const auto channels = decoded.texts("Neighbor Cell List", "UARFCN");
@@ -91,7 +71,10 @@ TEST(Consistency, OneUtranCellIsActiveAndServes) {
 }
 
 TEST(Consistency, TheCdmaPilotsAreThoseOfTheServingCells) {
-    inEveryDrive("cdma", seconds(60), [](const DecodedDisplay& decoded, std::uint32_t code) {
+    inEveryDrive({"cdma", seconds(60), kRate}, [](const DriveMoment& moment) {
+        const DecodedDisplay& decoded = moment.decoded;
+        const std::uint32_t code = moment.code;
+
         const PropertyList* list = nullptr;
         if (code == 0x12B6) {
             list = decoded.section("EV-DO").dictionary()->find("Active Set");
@@ -113,7 +96,9 @@ TEST(Consistency, TheCdmaPilotsAreThoseOfTheServingCells) {
 }
 
 TEST(Consistency, TheServingIfxCellIsNotItsOwnNeighbour) {
-    inEveryDrive("ifx", seconds(20), [](const DecodedDisplay& decoded, std::uint32_t /*code*/) {
+    inEveryDrive({"ifx", seconds(20), kRate}, [](const DriveMoment& moment) {
+        const DecodedDisplay& decoded = moment.decoded;
+
         EXPECT_FALSE(contains(decoded.texts("Neighbour Cells", "ARFCN"),
                               decoded.text("Serving Cell", "ARFCN")));
     });

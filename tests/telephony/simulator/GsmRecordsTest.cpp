@@ -42,8 +42,8 @@ TEST(GsmRecords, LevelsAndNeighboursAreShownAsEncodedWithTheirColourCodes) {
             }
             expected.emplace_back(entry);
         }
-        const gsm::Measurement measurement{-between(0, 256), between(0, 30000), between(0, 30000),
-                                           below(2) == 1, levels};
+        const gsm::CellMeasurement measurement{-between(0, 256), between(0, 30000),
+                                               between(0, 30000), below(2) == 1, levels};
         DecodedDisplay decoded("gsm");
         feedEncoded(decoded, gsm::BsicList{bsics});
         feedEncoded(decoded, measurement);
@@ -59,7 +59,17 @@ TEST(GsmRecords, LevelsAndNeighboursAreShownAsEncodedWithTheirColourCodes) {
 
 TEST(GsmRecords, TheRadioResourceControlIsShownAsEncoded) {
     EXPECT_TRUE(rc::check([] {
-        const gsm::RrInfo info{gsm::RrState::DataTransfer, below(256), below(256), below(2) == 1};
+        using gsm::RrState;
+        const auto state =
+            oneOf<RrState>({{RrState::Inactive, "RR_INACTIVE"},
+                            {RrState::Idle, "RR_IDLE"},
+                            {RrState::CellReselection, "RR_CELL_RESELECTION"},
+                            {RrState::ConnectionPending, "RR_CONNECTION_PENDING"},
+                            {RrState::DataTransfer, "RR_DATA_TRANSFER"},
+                            {RrState::ConnectionRelease, "RR_CONNECTION_RELEASE"},
+                            {RrState::FromUmts, "RR_W2G_INTERRAT_RESELECTION_PROGRESS"},
+                            {RrState::ToUmts, "RR_G2W_INTERRAT_RESELECTION_PROGRESS"}});
+        const gsm::RrInfo info{state.number, below(256), below(256), below(2) == 1};
         const gsm::Dtx dtx{below(2) == 1};
         const gsm::DedicatedChannel channel{below(256)};
         std::vector<unsigned> arfcns(below(64));
@@ -75,7 +85,7 @@ TEST(GsmRecords, TheRadioResourceControlIsShownAsEncoded) {
         feedEncoded(decoded, channel);
         feedEncoded(decoded, allocation);
         RC_ASSERT(decoded.section("GSM RR Info") ==
-                  PropertyList(Dictionary{{"RR State", "RR_DATA_TRANSFER"},
+                  PropertyList(Dictionary{{"RR State", state.label},
                                           {"RR Sub State", text(info.subState)},
                                           {"RR Status", text(info.status)},
                                           {"RR Mode", info.data ? "Data" : "Voice"},
@@ -93,7 +103,11 @@ TEST(GsmRecords, WhatACellBroadcastsIsShownAsEncoded) {
         const std::array<const char*, 8> kDurations = {"500 ms", "1000 ms", "1500 ms", "0 ms",
                                                        "80 ms",  "120 ms",  "160 ms",  "200 ms"};
         const gsm::Si13Position position{below(2) == 1};
-        const gsm::PacketControl control{below(2), 7, below(3)};
+        const auto access = oneOf<unsigned>({{0, "Barred (PKT access not allowed in the Cell)"},
+                                             {3, "1 Only"},
+                                             {6, "1 to 4"},
+                                             {7, "Allowed"}});
+        const gsm::PacketControl control{below(2), access.number, below(3)};
         const gsm::PacketTimers timers{below(8), below(256), below(2) == 1};
         const gsm::PacketBroadcast broadcast{below(2) == 1};
         const gsm::ExtendedMeasurement extended{below(256), below(256), below(256), below(256),
@@ -108,7 +122,7 @@ TEST(GsmRecords, WhatACellBroadcastsIsShownAsEncoded) {
             {"SI13 Position", position.extended ? "Located on Extended BCCH" : "Located on BCCH"},
             {"Network Control Order", kOrders.at(control.networkControlOrder)},
             {"PFC Supported", control.pfcSupported == 1 ? "Supported" : "Not Supported"},
-            {"Priority Access Threshold", "Allowed"},
+            {"Priority Access Threshold", access.label},
             {"T3192", kDurations.at(timers.t3192)},
             {"Access Burst Type", timers.elevenBitBursts ? "11-bit format" : "8-bit format"},
             {"DRX Timer Max", text(timers.drxTimer_s)},
@@ -124,8 +138,13 @@ TEST(GsmRecords, WhatACellBroadcastsIsShownAsEncoded) {
 
 TEST(GsmRecords, TheNetworkIsShownAsEncoded) {
     EXPECT_TRUE(rc::check([] {
-        const gsm::ServingPlmn plmn{below(3),     3,         100 + below(900), 10 + below(90),
-                                    below(65536), below(256)};
+        const auto service = oneOf<unsigned>({{0, "NO_SERVICE"},
+                                              {1, "CS_ONLY"},
+                                              {2, "PS_ONLY"},
+                                              {3, "CS_PS_SERVICE"},
+                                              {4, "LIMITED_SERVICE"}});
+        const gsm::ServingPlmn plmn{below(3),       service.number, 100 + below(900),
+                                    10 + below(90), below(65536),   below(256)};
         const gsm::EquivalentPlmn equivalent{100 + below(900), below(1000)};
         DecodedDisplay decoded("gsm");
         feedEncoded(decoded, plmn);
@@ -135,7 +154,7 @@ TEST(GsmRecords, TheNetworkIsShownAsEncoded) {
                                           {"Mobile Network Code", text(plmn.network) + " "},
                                           {"Location Area Code", text(plmn.locationArea)},
                                           {"Routing Area Code", text(plmn.routingArea)},
-                                          {"Service Type", "CS_PS_SERVICE"}}));
+                                          {"Service Type", service.label}}));
         RC_ASSERT(decoded.text("GPRS Information", "Network Operating Mode") ==
                   "Class " + text(plmn.operatingMode + 1));
         RC_ASSERT(
@@ -146,17 +165,57 @@ TEST(GsmRecords, TheNetworkIsShownAsEncoded) {
 }
 
 TEST(GsmRecords, TheMobilityStatesAreShownAsEncoded) {
-    DecodedDisplay decoded("gsm");
-    feedEncoded(decoded, gsm::Registration{gsm::ServiceState::Registering, 1});
-    feedEncoded(decoded, gsm::MobilityState{19, 8, 2});
-    feedEncoded(decoded, gsm::PacketMobilityState{3, 4, 1});
-    EXPECT_EQ(decoded.section("Process CS").description(),
-              "{ MM Service State = REG_STATE_REGISTERING; MM State = MM_IDLE; MM Sub State = "
-              "MM_NORMAL_SERVICE; LU Reject Cause = ROAMING_NOT_ALLOWED; }");
-    EXPECT_EQ(decoded.section("Process PS").description(),
-              "{ MM Service State = REG_STATE_REGISTERING; MM State = GMM_REGISTERED; MM Sub State "
-              "= GMM_NO_IMSI; Attach Reject Cause = GMM_GU2_NOT_UPDATED; }");
-    EXPECT_EQ(decoded.text("Serving PLMN", "PLMN Sel Mod"), "Manual");
+    EXPECT_TRUE(rc::check([] {
+        using gsm::ServiceState;
+        const auto service =
+            oneOf<ServiceState>({{ServiceState::Inactive, "REG_STATE_INACTIVE"},
+                                 {ServiceState::Idle, "REG_STATE_IDLE"},
+                                 {ServiceState::Registering, "REG_STATE_REGISTERING"},
+                                 {ServiceState::Deregistering, "REG_STATE_DEREGISTERING"},
+                                 {ServiceState::ManualSearch, "REG_STATE_MANUAL_SEARCH"},
+                                 {ServiceState::AutomaticSearch, "REG_STATE_AUTOMATIC_SEARCH"},
+                                 {ServiceState::Offline, "REG_STATE_OFFLINE"}});
+        const auto selection = oneOf<unsigned>({{0, "Automatic"}, {1, "Manual"}, {2, "Limited"}});
+        // Of either mobility management the numbers that the simulator sends.
+        const auto state =
+            oneOf<unsigned>({{0, "MM_NULL"}, {3, "MM_LOCATION_UPDATE_INITIATED"}, {19, "MM_IDLE"}});
+        const auto subState = oneOf<unsigned>({{0, "MM_NULL_SUBSTATE"},
+                                               {2, "MM_PLMN_SEARCH"},
+                                               {5, "MM_LOCATION_UPDATE_NEEDED"},
+                                               {8, "MM_NORMAL_SERVICE"}});
+        const auto update = oneOf<unsigned>({{0, "UPDATED"},
+                                             {1, "NOT_UPDATED"},
+                                             {2, "ROAMING_NOT_ALLOWED"},
+                                             {3, "LOCATION_AREA_NOT_ALLOWED"}});
+        const auto packet = oneOf<unsigned>({{0, "GMM_NULL"},
+                                             {1, "GMM_DEREGISTERED"},
+                                             {2, "GMM_REGISTERED_INITIATED"},
+                                             {3, "GMM_REGISTERED"},
+                                             {5, "GMM_ROUTING_AREA_UPDATE_INITIATED"},
+                                             {6, "GMM_SERVICE_REQUEST_INITIATED"}});
+        const auto packetSubState = oneOf<unsigned>({{0, "GMM_NORMAL_SERVICE"},
+                                                     {2, "GMM_ATTACH_NEEDED"},
+                                                     {6, "GMM_PLMN_SEARCH"},
+                                                     {8, "GMM_UPDATE_NEEDED"},
+                                                     {12, "GMM_NULL_SUBSTATE"}});
+        const auto attach = oneOf<unsigned>({{0, "GMM_GU1_UPDATED"}, {1, "GMM_GU2_NOT_UPDATED"}});
+        DecodedDisplay decoded("gsm");
+        feedEncoded(decoded, gsm::Registration{service.number, selection.number});
+        feedEncoded(decoded, gsm::MobilityState{state.number, subState.number, update.number});
+        feedEncoded(decoded,
+                    gsm::PacketMobilityState{packet.number, packetSubState.number, attach.number});
+        RC_ASSERT(decoded.section("Process CS") ==
+                  PropertyList(Dictionary{{"MM Service State", service.label},
+                                          {"MM State", state.label},
+                                          {"MM Sub State", subState.label},
+                                          {"LU Reject Cause", update.label}}));
+        RC_ASSERT(decoded.section("Process PS") ==
+                  PropertyList(Dictionary{{"MM Service State", service.label},
+                                          {"MM State", packet.label},
+                                          {"MM Sub State", packetSubState.label},
+                                          {"Attach Reject Cause", attach.label}}));
+        RC_ASSERT(decoded.text("Serving PLMN", "PLMN Sel Mod") == selection.label);
+    }));
 }
 
 TEST(GsmRecords, TheSearchersActiveCellsAreShownAsEncoded) {
@@ -217,12 +276,20 @@ TEST(GsmRecords, TheUmtsLinkIsShownAsEncoded) {
     EXPECT_TRUE(rc::check([] {
         const gsm::UmtsIdentity identity{below(16384), below(16384), below(1U << 28U),
                                          below(65536)};
+        using gsm::RrcState;
+        const auto state = oneOf<RrcState>({{RrcState::Disconnected, "Disconnected"},
+                                            {RrcState::Connecting, "Connecting"},
+                                            {RrcState::CellFach, "CELL_FACH"},
+                                            {RrcState::CellDch, "CELL_DCH"},
+                                            {RrcState::CellPch, "CELL_PCH"},
+                                            {RrcState::UraPch, "URA_PCH"}});
+        const gsm::Ciphering ciphering{below(2) == 1};
         // None that stands for "no value".
         const std::array<int, 2> slots = {between(-50, -20), between(0, 24)};
         DecodedDisplay decoded("gsm");
         feedEncoded(decoded, identity);
-        feedEncoded(decoded, gsm::RrcState::CellPch);
-        feedEncoded(decoded, gsm::Ciphering{true});
+        feedEncoded(decoded, state.number);
+        feedEncoded(decoded, ciphering);
         feedEncoded(decoded, gsm::TransmitPower{slots});
         const double mean = (slots[0] + slots[1]) / 2.0;
         RC_ASSERT(decoded.section("UMTS RR Info") ==
@@ -230,8 +297,8 @@ TEST(GsmRecords, TheUmtsLinkIsShownAsEncoded) {
                                           {"Downlink Frequency", text(identity.downlinkUarfcn)},
                                           {"Uplink Frequency", text(identity.uplinkUarfcn)},
                                           {"URA ID", text(identity.ura)},
-                                          {"RRC State", "CELL_PCH"},
-                                          {"Ciphering", "Enabled"},
+                                          {"RRC State", state.label},
+                                          {"Ciphering", ciphering.enabled ? "Enabled" : "Disabled"},
                                           {"Transmit Power", formatText("%4.2f dBm", {mean})}}));
     }));
 }
@@ -269,12 +336,16 @@ TEST(GsmRecords, BlocksAndHarqProcessesAreShownAsEncoded) {
         Array expectedSecondary;
         const auto primary = processes(1 + below(8), expectedPrimary);
         const auto secondary = processes(1 + below(8), expectedSecondary);
-        const gsm::Hsdpa hsdpa{below(1024), gsm::Hsdpa::Carriers::Dual, primary, secondary};
+        using Carriers = gsm::Hsdpa::Carriers;
+        const auto carriers = oneOf<Carriers>({{Carriers::Single, "Single Carrier"},
+                                               {Carriers::Mimo, "MIMO"},
+                                               {Carriers::Dual, "Dual Carrier"}});
+        const gsm::Hsdpa hsdpa{below(1024), carriers.number, primary, secondary};
         feedEncoded(decoded, hsdpa);
         RC_ASSERT(decoded.section("HSDPA Info") ==
                   PropertyList(Dictionary{{"Version", "1"},
                                           {"Sub Frames", text(hsdpa.subFrames)},
-                                          {"Carrier Info", "Dual Carrier"},
+                                          {"Carrier Info", carriers.label},
                                           {"Primary HARQ Process", expectedPrimary},
                                           {"Secondary HARQ Process", expectedSecondary}}));
     }));

@@ -10,10 +10,17 @@ TEST(UtranRecords, ModeAndServingCellAreShownAsEncoded) {
     EXPECT_TRUE(rc::check([] {
         const utran::ServingCell cell{below(256),   below(256),       below(65536),
                                       below(65536), below(1U << 28U), below(2) == 1};
+        using utran::RrcMode;
+        const auto mode = oneOf<RrcMode>({{RrcMode::Disconnected, "Disconnected"},
+                                          {RrcMode::Connecting, "Connecting"},
+                                          {RrcMode::Fach, "Cell Fach"},
+                                          {RrcMode::Dch, "Cell DCH"},
+                                          {RrcMode::Pch, "Cell PCH"},
+                                          {RrcMode::UraPch, "Cell URA PCH"}});
         DecodedDisplay decoded("utran");
-        feedEncoded(decoded, utran::RrcMode::UraPch);
+        feedEncoded(decoded, mode.number);
         feedEncoded(decoded, cell);
-        RC_ASSERT(decoded.text("RRC Info", "State") == "Cell URA PCH");
+        RC_ASSERT(decoded.text("RRC Info", "State") == mode.label);
         RC_ASSERT(decoded.section("Serving Cell Info") ==
                   PropertyList(
                       Dictionary{{"Cell Access Restrictions", text(cell.accessRestrictions)},

@@ -5,6 +5,7 @@
 #include <rapidcheck.h>
 
 #include <string>
+#include <vector>
 
 /// Random values that an encoder takes, and how a display tells them.
 namespace pallax {
@@ -21,6 +22,17 @@ inline double onGrid(double least, double step, unsigned count) {
 }
 inline std::string text(unsigned number) {
     return std::to_string(number);
+}
+
+/// One of a record's labels, with the number that stands for it.
+template <class Number = unsigned>
+struct Labelled {
+    Number number;
+    std::string label;
+};
+template <class Number>
+Labelled<Number> oneOf(const std::vector<Labelled<Number>>& all) {
+    return all[below(static_cast<unsigned>(all.size()))];
 }
 
 /// The display of that technology after the record of `value`.

@@ -1,0 +1,46 @@
+#include "host/Recording.h"
+#include "samples/Sample.h"
+#include "telephony/simulator/Simulation.h"
+
+#include <chrono>
+
+// Drives of the simulated modem; the seeds are those whose drives show most within their time.
+
+namespace pallax {
+
+namespace {
+
+using std::chrono::seconds;
+
+std::vector<SamplePacket> drive(std::string_view technology, std::uint64_t seed, seconds duration,
+                                unsigned packetsPerSecond) {
+    SimulationOptions options;
+    options.technology = technologyOfCommandName(technology);
+    options.seed = seed;
+    options.duration = duration;
+    options.packetsPerSecond = packetsPerSecond;
+    Simulation simulation(options);
+    std::vector<SamplePacket> packets;
+    while (const auto packet = simulation.next()) {
+        packets.push_back({packet->time, ByteBuffer(packet->data.begin(), packet->data.end())});
+    }
+    return packets;
+}
+
+} // namespace
+
+static_assert(Simulation::kStart == kSampleStart);
+
+std::vector<SamplePacket> cdmaDrivePackets() {
+    return drive("cdma", 25, seconds(60), 12);
+}
+
+std::vector<SamplePacket> lteDrivePackets() {
+    return drive("lte", 8, seconds(120), 10);
+}
+
+std::vector<SamplePacket> utranDrivePackets() {
+    return drive("utran", 13, seconds(120), 6);
+}
+
+} // namespace pallax

@@ -1,0 +1,72 @@
+#include "telephony/StreamOpening.h"
+
+#include "platform/Format.h"
+
+#include <condition_variable>
+#include <mutex>
+#include <thread>
+
+namespace pallax {
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+
+long long secondsOf(Clock::duration time) {
+    return std::chrono::duration_cast<std::chrono::seconds>(time).count();
+}
+
+/// Looks on while somebody else waits.
+class Watch {
+public:
+    explicit Watch(const StreamOpening& opening) : _opening(opening), _thread([this] { look(); }) {}
+    ~Watch() { end(); }
+    Watch(const Watch&) = delete;
+    Watch& operator=(const Watch&) = delete;
+
+    /// The wait is over. True when it was reported.
+    bool end() {
+        {
+            const std::lock_guard lock(_mutex);
+            _isOver = true;
+        }
+        _over.notify_one();
+        if (_thread.joinable()) {
+            _thread.join();
+        }
+        return _hasReported;
+    }
+
+private:
+    void look() {
+        std::unique_lock lock(_mutex);
+        if (!_over.wait_for(lock, _opening.patience, [this] { return _isOver; })) {
+            _hasReported = true;
+            _opening.report(formatText("The stream has stalled: no header for %lld s.",
+                                       {secondsOf(_opening.patience)}));
+        }
+    }
+
+    const StreamOpening& _opening;
+    std::mutex _mutex;
+    std::condition_variable _over;
+    bool _isOver = false;
+    bool _hasReported = false;
+    std::thread _thread; // the last, for it uses the others
+};
+
+} // namespace
+
+StreamOpening::Opened openStream(const StreamOpening& opening) {
+    const Clock::time_point begun = Clock::now();
+    Watch watch(opening);
+    auto opened = opening.open();
+    const bool hasStalled = watch.end();
+    if (hasStalled && opened) {
+        opening.report(
+            formatText("The stream goes on after %lld s.", {secondsOf(Clock::now() - begun)}));
+    }
+    return opened;
+}
+
+} // namespace pallax

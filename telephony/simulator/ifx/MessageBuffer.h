@@ -1,0 +1,55 @@
+#pragma once
+
+#include "platform/Bytes.h"
+
+#include <algorithm>
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+
+namespace pallax::ifx {
+
+/// Throws std::length_error: a message holds too much.
+[[noreturn]] void refuseMessage();
+
+/// Room for some bytes of a message, without any allocation. More than it holds is refused.
+template <std::size_t kCapacity>
+class FixedBuffer {
+public:
+    static constexpr std::size_t capacity() { return kCapacity; }
+
+    std::size_t size() const { return _size; }
+    void put(std::uint8_t byte) { *room(1) = byte; }
+    void put(Bytes bytes) { std::copy(bytes.begin(), bytes.end(), room(bytes.size())); }
+    void put(std::string_view text) { std::copy(text.begin(), text.end(), room(text.size())); }
+    void fill(std::size_t count, std::uint8_t byte) { std::fill_n(room(count), count, byte); }
+    /// Of so many bytes, high ones first.
+    void putNumber(std::uint64_t number, std::size_t width) {
+        constexpr unsigned kBitsPerByte = 8;
+        std::uint8_t* place = room(width);
+        for (std::size_t byte = width; byte > 0; --byte) {
+            *place++ = static_cast<std::uint8_t>(number >> (kBitsPerByte * (byte - 1)));
+        }
+    }
+    Bytes bytes() const { return Bytes(_bytes).first(_size); }
+    /// Forgets all but the first `size` bytes.
+    void cutTo(std::size_t size) { _size = size; }
+
+private:
+    std::uint8_t* room(std::size_t count) {
+        if (count > kCapacity - _size) {
+            refuseMessage();
+        }
+        std::uint8_t* place = _bytes.data() + _size;
+        _size += count;
+        return place;
+    }
+
+    std::array<std::uint8_t, kCapacity> _bytes; // only what has been put is set
+    std::size_t _size = 0;
+};
+
+using MessageBuffer = FixedBuffer<8192>;
+
+} // namespace pallax::ifx

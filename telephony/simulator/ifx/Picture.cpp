@@ -1,0 +1,176 @@
+#include "telephony/simulator/ifx/Picture.h"
+
+#include "telephony/simulator/ifx/BinaryObjectWriter.h"
+#include "telephony/simulator/ifx/ShortText.h"
+#include "telephony/simulator/ifx/XmlObjectWriter.h"
+
+namespace pallax::ifx {
+
+namespace {
+
+Word wordOf(RrState state) {
+    switch (state) {
+    case RrState::Off:
+        return Word::Off;
+    case RrState::Selection:
+        return Word::CellSelection;
+    case RrState::Establishment:
+        return Word::ConnectionEstablishment;
+    case RrState::Dedicated:
+        return Word::Dedicated;
+    case RrState::Release:
+        return Word::ConnectionRelease;
+    case RrState::Idle:
+        break;
+    }
+    return Word::Idle;
+}
+
+/// Tells a writer of one of the forms what a picture holds. The modem wraps what has a unit or a
+/// name into a dictionary of its own.
+template <class Writer>
+class Teller {
+public:
+    explicit Teller(Writer& writer) : _writer(writer) {}
+
+    void tell(const Picture& picture) {
+        _writer.beginDictionary();
+        network(picture.isRegistered);
+        _writer.key(Word::Rr);
+        _writer.beginDictionary();
+        _writer.key(Word::State);
+        wrapped(Word::Name, wordOf(picture.state));
+        _writer.endDictionary();
+        serving(picture.serving);
+        neighbours(picture.neighbours);
+        _writer.key(Word::DedicatedChannel);
+        if (picture.dedicated) {
+            dedicated(*picture.dedicated);
+        } else {
+            _writer.emptyDictionary();
+        }
+        _writer.endDictionary();
+    }
+
+private:
+    template <class Text>
+    void wrapped(Word key, Text text) {
+        _writer.beginDictionary();
+        _writer.key(key);
+        _writer.text(text);
+        _writer.endDictionary();
+    }
+    void entry(Word key, Word value) {
+        _writer.key(key);
+        _writer.text(value);
+    }
+    void entry(Word key, const ShortText& value) {
+        _writer.key(key);
+        _writer.text(value.view());
+    }
+    template <class Number>
+    void entry(Word key, Number number) {
+        entry(key, ShortText(number));
+    }
+    void bsic(ColourCode code) {
+        entry(Word::Bsic, ShortText(code.network).then(",").then(code.station));
+    }
+    void level(Word key, int level_dbm) {
+        _writer.key(key);
+        wrapped(Word::Value, ShortText(level_dbm).then(" dBm").view());
+    }
+
+    void network(bool isRegistered);
+    void serving(const ServingCell& cell);
+    void neighbours(std::span<const NeighbourCell> cells);
+    void dedicated(const DedicatedChannel& channel);
+
+    Writer& _writer;
+};
+
+template <class Writer>
+void Teller<Writer>::network(bool isRegistered) {
+    _writer.key(Word::Network);
+    _writer.beginDictionary();
+    _writer.key(Word::Registered);
+    if (isRegistered) {
+        _writer.beginDictionary();
+        entry(Word::Name, Word::SampleNet);
+        entry(Word::Mcc, Word::Mcc262);
+        entry(Word::Mnc, Word::Mnc42);
+        _writer.endDictionary();
+    } else {
+        _writer.text(Word::No);
+    }
+    _writer.endDictionary();
+}
+
+template <class Writer>
+void Teller<Writer>::serving(const ServingCell& cell) {
+    _writer.key(Word::ServingCell);
+    _writer.beginDictionary();
+    entry(Word::Arfcn, cell.arfcn);
+    bsic(cell.bsic);
+    level(Word::RxLevel, cell.level_dbm);
+    entry(Word::C1, cell.c1);
+    _writer.key(Word::Area);
+    _writer.beginDictionary();
+    entry(Word::Lac, cell.locationArea);
+    entry(Word::CellId, cell.cellId);
+    _writer.endDictionary();
+    _writer.endDictionary();
+}
+
+template <class Writer>
+void Teller<Writer>::neighbours(std::span<const NeighbourCell> cells) {
+    _writer.key(Word::NeighbourCells);
+    _writer.beginArray();
+    _writer.text(Word::NeighbourHeader);
+    for (const NeighbourCell& cell : cells) {
+        _writer.beginDictionary();
+        entry(Word::Arfcn, cell.arfcn);
+        if (cell.isRead) {
+            bsic(cell.bsic);
+            level(Word::RxLevel, cell.level_dbm);
+        }
+        _writer.endDictionary();
+    }
+    _writer.endArray();
+}
+
+template <class Writer>
+void Teller<Writer>::dedicated(const DedicatedChannel& channel) {
+    _writer.beginDictionary();
+    _writer.key(Word::Channel);
+    wrapped(Word::Type, channel.type == ChannelType::Traffic ? Word::TchF : Word::Sdcch8);
+    entry(Word::TimeSlot, channel.timeSlot);
+    entry(Word::TimingAdvance, channel.timingAdvance);
+    entry(Word::RxQuality, channel.quality);
+    level(Word::TxPower, channel.power_dbm);
+    if (!channel.hopping.empty()) {
+        _writer.key(Word::Hopping);
+        _writer.beginArray();
+        _writer.text(Word::HoppingHeader);
+        for (const unsigned arfcn : channel.hopping) {
+            _writer.text(ShortText(arfcn).view());
+        }
+        _writer.endArray();
+    }
+    _writer.endDictionary();
+}
+
+} // namespace
+
+void encode(const Picture& picture, ListForm form, ByteBuffer& out) {
+    if (form == ListForm::Binary) {
+        BinaryObjectWriter writer;
+        Teller(writer).tell(picture);
+        writer.finish(out);
+    } else {
+        XmlObjectWriter writer;
+        Teller(writer).tell(picture);
+        writer.finish(out);
+    }
+}
+
+} // namespace pallax::ifx

@@ -1,0 +1,15 @@
+#include "telephony/simulator/ifx/XmlObjectWriter.h"
+
+namespace pallax::ifx {
+
+XmlObjectWriter::XmlObjectWriter() {
+    _message.put("<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
+                 "<plist version=\"1.0\">\n");
+}
+
+void XmlObjectWriter::finish(ByteBuffer& out) {
+    _message.put("</plist>\n");
+    out.assign(_message.bytes().begin(), _message.bytes().end());
+}
+
+} // namespace pallax::ifx
