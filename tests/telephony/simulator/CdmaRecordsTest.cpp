@@ -21,7 +21,7 @@ double numberOf(const std::string& shown) {
 }
 
 TEST(CdmaRecords, TheEvdoStatusIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const auto band = oneOf<unsigned>({{0, "800 MHz cellular band [0]"},
                                            {1, "1.8 to 2.0GHz PCS band [1]"},
                                            {12, "800 MHz European PAMR band [12]"}});
@@ -44,7 +44,7 @@ TEST(CdmaRecords, TheEvdoStatusIsShownAsEncoded) {
 }
 
 TEST(CdmaRecords, TheEvdoStatesAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         using cdma::EvdoSession;
         using cdma::EvdoState;
         const auto state = oneOf<EvdoState>({{EvdoState::Inactive, "Inactive [0]"},
@@ -77,7 +77,7 @@ std::vector<cdma::Pilot> pilots(unsigned count) {
 }
 
 TEST(CdmaRecords, PilotsAndFingersAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const std::vector<cdma::Pilot> list = pilots(1 + below(6));
         DecodedDisplay decoded("cdma");
         feedEncoded(decoded, cdma::EvdoActiveSet{list});
@@ -95,7 +95,7 @@ TEST(CdmaRecords, PilotsAndFingersAreShownAsEncoded) {
 }
 
 TEST(CdmaRecords, TheOneXStatusIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const std::vector<cdma::Pilot> list = pilots(1 + below(6));
         const cdma::OneXStatus status{cdma::OneXState::Traffic,
                                       0,
@@ -130,7 +130,7 @@ TEST(CdmaRecords, TheOneXStatusIsShownAsEncoded) {
 }
 
 TEST(CdmaRecords, TheOneXStateIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         using cdma::OneXState;
         const auto state = oneOf<OneXState>({{OneXState::Inactive, "Inactive [0]"},
                                              {OneXState::Acquisition, "Acquisition [3]"},
@@ -153,7 +153,7 @@ TEST(CdmaRecords, FramesInErrorAreCounted) {
 }
 
 TEST(CdmaRecords, TheDataRatesAreThoseOfTheCountedPackets) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const cdma::ForwardPackets forward{below(1000), below(10000), below(10000), below(10000)};
         const cdma::ReversePackets reverse{below(1000), below(10000), below(10000)};
         const unsigned more = below(500);
@@ -173,7 +173,7 @@ TEST(CdmaRecords, TheDataRatesAreThoseOfTheCountedPackets) {
 }
 
 TEST(CdmaRecords, TheSystemIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const cdma::SystemIdentity system{0,          below(65536), below(65536),
                                           below(256), below(256),   below(65536)};
         DecodedDisplay decoded("cdma");

@@ -16,7 +16,7 @@ DecodedDisplay shown(const Value& value) {
 }
 
 TEST(GsmRecords, AServingCellIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const gsm::ServingIdentity cell{below(65536), below(65536), below(65536)};
         RC_ASSERT(shown(cell).section("GSM Serving Cell") ==
                   PropertyList(Dictionary{{"Cell ID", text(cell.cellId)},
@@ -26,7 +26,7 @@ TEST(GsmRecords, AServingCellIsShownAsEncoded) {
 }
 
 TEST(GsmRecords, LevelsAndNeighboursAreShownAsEncodedWithTheirColourCodes) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         std::vector<gsm::NeighbourLevel> levels(1 + below(32));
         std::vector<gsm::NeighbourBsic> bsics;
         Array expected;
@@ -58,7 +58,7 @@ TEST(GsmRecords, LevelsAndNeighboursAreShownAsEncodedWithTheirColourCodes) {
 }
 
 TEST(GsmRecords, TheRadioResourceControlIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         using gsm::RrState;
         const auto state =
             oneOf<RrState>({{RrState::Inactive, "RR_INACTIVE"},
@@ -98,7 +98,7 @@ TEST(GsmRecords, TheRadioResourceControlIsShownAsEncoded) {
 }
 
 TEST(GsmRecords, WhatACellBroadcastsIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const std::array<const char*, 3> kOrders = {"NC0", "NC1", "NC2"};
         const std::array<const char*, 8> kDurations = {"500 ms", "1000 ms", "1500 ms", "0 ms",
                                                        "80 ms",  "120 ms",  "160 ms",  "200 ms"};
@@ -137,7 +137,7 @@ TEST(GsmRecords, WhatACellBroadcastsIsShownAsEncoded) {
 }
 
 TEST(GsmRecords, TheNetworkIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const auto service = oneOf<unsigned>({{0, "NO_SERVICE"},
                                               {1, "CS_ONLY"},
                                               {2, "PS_ONLY"},
@@ -165,7 +165,7 @@ TEST(GsmRecords, TheNetworkIsShownAsEncoded) {
 }
 
 TEST(GsmRecords, TheMobilityStatesAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         using gsm::ServiceState;
         const auto service =
             oneOf<ServiceState>({{ServiceState::Inactive, "REG_STATE_INACTIVE"},
@@ -219,7 +219,7 @@ TEST(GsmRecords, TheMobilityStatesAreShownAsEncoded) {
 }
 
 TEST(GsmRecords, TheSearchersActiveCellsAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         std::vector<gsm::SearchedCell> cells(1 + below(8));
         const int carrier_dbm = between(-105, -30);
         Array expected;
@@ -238,7 +238,7 @@ TEST(GsmRecords, TheSearchersActiveCellsAreShownAsEncoded) {
 }
 
 TEST(GsmRecords, RankingsAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         std::vector<gsm::RankedUmtsCell> umts(1 + below(8));
         std::vector<gsm::RankedGsmCell> gsmCells(1 + below(8));
         Array expectedUmts;
@@ -273,7 +273,7 @@ TEST(GsmRecords, RankingsAreShownAsEncoded) {
 }
 
 TEST(GsmRecords, TheUmtsLinkIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const gsm::UmtsIdentity identity{below(16384), below(16384), below(1U << 28U),
                                          below(65536)};
         using gsm::RrcState;
@@ -304,7 +304,7 @@ TEST(GsmRecords, TheUmtsLinkIsShownAsEncoded) {
 }
 
 TEST(GsmRecords, BlocksAndHarqProcessesAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         std::vector<gsm::ChannelBlocks> channels(below(8));
         Array expectedChannels;
         for (gsm::ChannelBlocks& channel : channels) {

@@ -102,7 +102,7 @@ struct RandomPicture {
 };
 
 TEST(IfxPicture, IsShownAsEncodedInBothForms) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const RandomPicture random;
         for (const ListForm form : {ListForm::Binary, ListForm::Xml}) {
             ByteBuffer bytes;
@@ -115,7 +115,7 @@ TEST(IfxPicture, IsShownAsEncodedInBothForms) {
 }
 
 TEST(IfxPicture, ItsFormsHoldTheSameAndItsXmlIsThatOfTheSerialiser) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const RandomPicture random;
         ByteBuffer binary;
         ByteBuffer xml;

@@ -22,7 +22,7 @@ DecodedDisplay shown(std::string_view technology, std::uint32_t code, const Prop
 }
 
 TEST(InjectedRecords, PacketDataContextsAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         Array contexts;
         for (unsigned count = below(5); count > 0; --count) {
             contexts.emplace_back(
@@ -43,7 +43,7 @@ TEST(InjectedRecords, ASessionAddsAContext) {
 }
 
 TEST(InjectedRecords, TheSimFilesTellModeAndAreaAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const std::string mode = "mode " + text(below(1000));
         const unsigned area = below(65536);
         const DecodedDisplay decoded = shown("gsm", kSimFilesCode, simFiles(mode, area));
@@ -58,7 +58,7 @@ TEST(InjectedRecords, TheSimFilesTellModeAndAreaAsEncoded) {
 }
 
 TEST(InjectedRecords, CellsOfTheMonitorAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const unsigned area = below(65536);
         const unsigned identity = below(1U << 28U);
         const unsigned code = below(504);
@@ -75,7 +75,7 @@ TEST(InjectedRecords, CellsOfTheMonitorAreShownAsEncoded) {
 }
 
 TEST(InjectedRecords, AGsmNeighbourTellsItsLevelInStepsOfTwo) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         Cell cell;
         cell.channel = below(1024);
         const int level_dbm = between(-113, -30);

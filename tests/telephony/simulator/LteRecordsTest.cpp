@@ -25,7 +25,7 @@ DecodedDisplay shown(const Value& value) {
 }
 
 TEST(LteRecords, AServingCellIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const lte::ServingCellInfo info{below(504), below(65536),     below(65536), 50,
                                         25,         below(1U << 28U), below(65536), below(256)};
         const DecodedDisplay decoded = shown(info);
@@ -42,7 +42,7 @@ TEST(LteRecords, AServingCellIsShownAsEncoded) {
 }
 
 TEST(LteRecords, AntennasAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const unsigned count = below(256);
         RC_ASSERT(shown(lte::AntennaReport{count}).text("Serving Cell Info", "Num Tx Antennas") ==
                   std::to_string(count));
@@ -50,7 +50,7 @@ TEST(LteRecords, AntennasAreShownAsEncoded) {
 }
 
 TEST(LteRecords, AnIdleServingCellIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         lte::IdleServing cell{};
         cell.earfcn = below(65536);
         cell.physicalCellId = below(504);
@@ -95,7 +95,7 @@ TEST(LteRecords, AnIdleServingCellIsShownAsEncoded) {
 }
 
 TEST(LteRecords, IdleNeighboursAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         std::vector<lte::IdleNeighbour> cells(1 + below(32));
         Array expected;
         for (lte::IdleNeighbour& cell : cells) {
@@ -133,7 +133,7 @@ TEST(LteRecords, IdleNeighboursAreShownAsEncoded) {
 }
 
 TEST(LteRecords, AConnectedMeasurementIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const auto cell = [] {
             return lte::ConnectedCell{below(504), onGrid(-140, 0.25, 512), onGrid(-20, 0.125, 160)};
         };
@@ -171,7 +171,7 @@ TEST(LteRecords, AConnectedMeasurementIsShownAsEncoded) {
 
 TEST(LteRecords, ACandidateOfEachTechnologyIsShownAsEncoded) {
     using Technology = lte::ReselectionCandidate::Technology;
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const auto technology = static_cast<Technology>(below(5));
         const lte::ReselectionCandidate candidate{technology, below(8), below(65536), below(256),
                                                   below(256)};

@@ -7,7 +7,7 @@ namespace pallax {
 namespace {
 
 TEST(UtranRecords, ModeAndServingCellAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const utran::ServingCell cell{below(256),   below(256),       below(65536),
                                       below(65536), below(1U << 28U), below(2) == 1};
         using utran::RrcMode;
@@ -34,7 +34,7 @@ TEST(UtranRecords, ModeAndServingCellAreShownAsEncoded) {
 }
 
 TEST(UtranRecords, MeasuredCellsAreShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const std::array<const char*, 3> kSets = {"ASET", "MSET", "DSET"};
         std::vector<utran::MeasuredCell> cells(below(128));
         Array expected;
@@ -70,7 +70,7 @@ TEST(UtranRecords, GsmNeighboursHaveTheirPlaces) {
 }
 
 TEST(UtranRecords, ChannelQualityIsShownAsEncoded) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         std::vector<utran::TransportChannel> transport(below(64));
         std::vector<utran::CompositeChannel> composite(below(16));
         Array expectedTransport;

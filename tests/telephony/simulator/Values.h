@@ -1,8 +1,9 @@
 #pragma once
 
+#include "tests/doubles/Property.h"
 #include "tests/telephony/simulator/SimulatedPhone.h"
 
-#include <rapidcheck.h>
+#include <rapidcheck.h> // for RC_ASSERT
 
 #include <string>
 #include <vector>
@@ -11,10 +12,10 @@
 namespace pallax {
 
 inline unsigned below(unsigned bound) {
-    return *rc::gen::inRange(0U, bound);
+    return static_cast<unsigned>(doubles::any::between(0, static_cast<int>(bound)));
 }
 inline int between(int least, int bound) {
-    return *rc::gen::inRange(least, bound);
+    return doubles::any::between(least, bound);
 }
 /// A level on the grid of a record: `least` plus a number of steps.
 inline double onGrid(double least, double step, unsigned count) {
