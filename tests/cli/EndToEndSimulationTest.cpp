@@ -4,6 +4,9 @@
 
 #include <fstream>
 #include <iterator>
+#include <map>
+#include <set>
+#include <sstream>
 
 // A simulated modem through the real program, and the service in its child process.
 
@@ -32,6 +35,53 @@ TEST_F(EndToEndSimulation, ADemoOfEachTechnologyPrintsTheTicksOfItsMinuteAndEnds
         }
         EXPECT_EQ(ticks, 30U);
         EXPECT_NE(demo.out.find("== 2023-11-14 22:14:20 +0000"), std::string::npos);
+    }
+}
+
+/// The sections of a printed display, and whether each had something in it at any tick.
+std::map<std::string, bool> sectionsIn(const std::string& printed) {
+    std::map<std::string, bool> filled;
+    std::istringstream lines(printed);
+    std::string section;
+    for (std::string line; std::getline(lines, line);) {
+        const bool isInside = line.starts_with(" ") || line.starts_with("*");
+        if (isInside) {
+            filled[section] = true;
+        } else if (!line.starts_with("== ") && !line.starts_with("Deallocing ")) {
+            const auto value = line.find(": "); // a section may be a value itself
+            section = line.substr(0, value);
+            filled[section] = filled[section] || value != std::string::npos;
+        }
+    }
+    filled.erase("");
+    return filled;
+}
+
+TEST_F(EndToEndSimulation, ADemoOfEachTechnologyFillsEverySectionThatCanFillWithinAMinute) {
+    // Those whose records take no code, or add no entry.
+    const std::map<std::string_view, std::set<std::string>> neverFilled = {
+        {"gsm",
+         {"Coding Scheme", "UMTS RR Measurement", "Cell Change Counters", "Non-Ranked GSM Set",
+          "Non-Ranked UMTS Set", "Detected Set", "Monitored Set", "Virtual Active Set"}},
+        {"utran", {"GSM Neighbor Cell List"}},
+    };
+    const std::map<std::string_view, std::size_t> counts = {
+        {"ifx", 5}, {"gsm", 26}, {"cdma", 4}, {"lte", 11}, {"utran", 8}};
+    for (const RecordedTechnology* technology : simulatedTechnologies()) {
+        SCOPED_TRACE(technology->commandName);
+        const Run demo = run({"demo", std::string(technology->commandName), "--seconds", "60",
+                              "--speed", "max", "--print"});
+        EXPECT_EQ(demo.status, 0);
+        const auto sections = sectionsIn(demo.out);
+        EXPECT_EQ(sections.size(), counts.at(technology->commandName));
+        std::set<std::string> empty;
+        for (const auto& [section, isFilled] : sections) {
+            if (!isFilled) {
+                empty.insert(section);
+            }
+        }
+        const auto never = neverFilled.find(technology->commandName);
+        EXPECT_EQ(empty, never != neverFilled.end() ? never->second : std::set<std::string>());
     }
 }
 

@@ -205,7 +205,7 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
     EXPECT_EQ(sentence({"service", "--play", "a", "--seconds", "3"}),
               "pallax: --seconds requires --simulate (pallax --help tells more)\n");
     EXPECT_EQ(sentence({"service", "--relay", "-", "--speed", "2"}),
-              "pallax: --relay excludes --speed (pallax --help tells more)\n");
+              "pallax: --speed excludes --relay (pallax --help tells more)\n");
     EXPECT_EQ(sentence({"service", "--speed", "2"}),
               "pallax: the service needs --play, --simulate, --relay or --status (pallax --help "
               "tells more)\n");

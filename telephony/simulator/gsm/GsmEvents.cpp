@@ -154,11 +154,15 @@ void queuePhase(const Scenario& scenario, RecordQueue& queue) {
 }
 
 void queueServingCell(const Scenario& scenario, RecordQueue& queue) {
-    const bool started = scenario.now().count() == 0;
-    if (scenario.hasNewLayer() && !started) {
+    const bool changesLayer = scenario.hasNewLayer() && scenario.now().count() > 0;
+    if (changesLayer) {
         encode(RrInfo{onGsm(scenario) ? RrState::FromUmts : RrState::ToUmts, 0, 0, true},
                queue.add());
-        encodeServingPlmn(scenario, queue.add());
+    }
+    if (scenario.activity().isRegistered()) {
+        encodeServingPlmn(scenario, queue.add()); // the cell may lie in another area
+    }
+    if (changesLayer) {
         if (!onGsm(scenario)) {
             encode(RrInfo{RrState::Inactive, 0, 0, true}, queue.add());
         }

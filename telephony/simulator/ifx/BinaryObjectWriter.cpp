@@ -14,12 +14,13 @@ static_assert(MessageBuffer::capacity() <= std::numeric_limits<std::uint16_t>::m
 
 void putMarker(MessageBuffer& out, Kind kind, std::size_t count) {
     constexpr unsigned kHalfByte = 4;
+    const unsigned high = unsigned{kind} << kHalfByte;
     if (count < kCountFollows) {
-        out.put(static_cast<std::uint8_t>(kind << kHalfByte | count));
+        out.put(static_cast<std::uint8_t>(high | count));
         return;
     }
     // The count follows as an integer, of one byte: all that is told is shorter than 256.
-    out.put(static_cast<std::uint8_t>(kind << kHalfByte | kCountFollows));
+    out.put(static_cast<std::uint8_t>(high | kCountFollows));
     out.put(kInteger << kHalfByte);
     out.put(static_cast<std::uint8_t>(count));
 }

@@ -1,5 +1,7 @@
 #include "tests/telephony/simulator/Drives.h"
 
+#include <optional>
+
 // That records of GSM/UMTS, UTRAN, CDMA and IFX agree with each other; LTE has a test of its own.
 
 namespace pallax {
@@ -49,6 +51,87 @@ TEST(Consistency, TheServingGsmCellIsNotItsOwnNeighbour) {
             EXPECT_TRUE(level >= 35 && level <= 115) << level;
         }
     });
+}
+
+/// What the list of cells tells of the serving cell is what the record before it told.
+class SameIdentity {
+public:
+    SameIdentity(std::string section, std::vector<std::string> keys)
+        : _section(std::move(section)), _keys(std::move(keys)) {}
+
+    void see(const DriveMoment& moment) {
+        constexpr std::uint32_t kCellMonitor = 0xFF0001;
+        std::vector<std::string> told;
+        for (const std::string& key : _keys) {
+            told.push_back(moment.decoded.text(_section, key));
+        }
+        const bool isKnown = _seed == moment.seed && !contains(_told, "(absent)");
+        if (moment.code == kCellMonitor && isKnown) {
+            EXPECT_EQ(told, _told);
+            ++_compared;
+        }
+        _told = told;
+        _seed = moment.seed;
+    }
+    std::size_t compared() const { return _compared; }
+
+private:
+    std::string _section;
+    std::vector<std::string> _keys;
+    std::optional<std::uint64_t> _seed;
+    std::vector<std::string> _told;
+    std::size_t _compared = 0;
+};
+
+TEST(Consistency, TheServingGsmCellIsTheSameInEveryRecordThatTellsOfIt) {
+    SameIdentity cell("GSM Serving Cell", {"ARFCN", "Cell ID"});
+    SameIdentity network("Serving PLMN", {"Mobile Country Code", "Location Area Code"});
+    inEveryDrive({"gsm", seconds(60), kRate}, [&](const DriveMoment& moment) {
+        cell.see(moment);
+        network.see(moment);
+    });
+    EXPECT_GT(cell.compared(), 0U);
+    EXPECT_GT(network.compared(), PALLAX_DRIVES);
+}
+
+TEST(Consistency, TheServingUtranCellIsTheSameInEveryRecordThatTellsOfIt) {
+    SameIdentity cell("Serving Cell Info", {"Cell ID", "Downlink UARFCN", "Uplink UARFCN"});
+    inEveryDrive({"utran", seconds(60), kRate},
+                 [&](const DriveMoment& moment) { cell.see(moment); });
+    EXPECT_GT(cell.compared(), PALLAX_DRIVES);
+}
+
+TEST(Consistency, TheServingEvdoPilotIsInTheActiveSet) {
+    std::optional<std::uint64_t> seed;
+    std::string before;  // the serving pilot that was told last
+    std::string between; // the first of the active set since
+    std::size_t compared = 0;
+    inEveryDrive({"cdma", seconds(60), kRate}, [&](const DriveMoment& moment) {
+        if (moment.seed != seed) {
+            before.clear();
+            between.clear();
+            seed = moment.seed;
+        }
+        if (moment.code == 0x12B6) {
+            const PropertyList* list =
+                moment.decoded.section("EV-DO").dictionary()->find("Active Set");
+            for (const Dictionary::Entry& entry : *list->dictionary()) {
+                const std::string key = entry.key.string();
+                between = key.starts_with("0;") ? key.substr(2) : between;
+            }
+        } else if (moment.code == 0x1183) {
+            std::string now = moment.decoded.text("EV-DO", "Serving PN Offset");
+            now.resize(std::min(now.find(' '), now.size()));
+            if (!between.empty() && !before.empty()) {
+                EXPECT_TRUE(between == before || between == now)
+                    << between << ", but " << before << " and then " << now << " serve";
+                ++compared;
+            }
+            before = now;
+            between.clear();
+        }
+    });
+    EXPECT_GT(compared, 10U * PALLAX_DRIVES);
 }
 
 TEST(Consistency, OneUtranCellIsActiveAndServes) {
