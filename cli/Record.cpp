@@ -77,7 +77,6 @@ ExitStatus record(const RecordOptions& options) {
 } // namespace
 
 ExitStatus runRecord(const RecordOptions& options) {
-    (void)std::signal(SIGXFSZ, SIG_IGN); // a file that may not grow is an error of write
     SyslogSink syslog("pallax");
     StderrSink standardError;
     const int wanted = options.logLevel.value_or(kNothing);

@@ -3,6 +3,7 @@
 #include "host/Recording.h"
 #include "platform/Format.h"
 #include "platform/PropertyListCodec.h"
+#include "platform/TimeGrid.h"
 #include "telephony/ControlMessages.h"
 
 #include <algorithm>
@@ -70,7 +71,10 @@ bool Recorder::replied(Bytes reply) {
                         {technology->identifier, technology->commandName, _wanted->commandName}));
         return false;
     }
-    _technology = technology;
+    if (technology != nullptr) { // otherwise, as for the model, the earlier one stays
+        _technology = technology;
+        _isNewLink = true;
+    }
     return true;
 }
 
@@ -78,9 +82,25 @@ void Recorder::packetArrived(Bytes packet) {
     if (_technology == nullptr || _failure) {
         return;
     }
-    if (const auto error = _files.add(*_technology, _link.clock().now(), packet)) {
+    if (const auto error = _files.add(*_technology, stamp(), packet)) {
         fail(formatText("%@ %llu packets are recorded.", {error->sentence, _files.packets()}));
     }
+}
+
+/// When the packet arrived by its source's time. A source that begins again after the link was lost
+/// goes on at the next tick, so that the stamps of a file never step back.
+Time Recorder::stamp() {
+    const Time now = _link.clock().now();
+    const bool beginsAgain = std::exchange(_isNewLink, false) && _first && now + _shift <= _latest;
+    if (!_first) {
+        _first = now;
+        _latest = now;
+    }
+    if (beginsAgain) {
+        _shift = TimeGrid(*_first, PallaxModel::kDisplayInterval).nextAfter(_latest) - now;
+    }
+    _latest = std::max(_latest, now + _shift);
+    return now + _shift;
 }
 
 void Recorder::fail(std::string sentence) {

@@ -42,6 +42,7 @@ private:
     void packetArrived(Bytes packet) override;
     void updateViewControllerFromModel() override {}
     PallaxModel::Platform platform();
+    Time stamp();
     void tellProgress();
     void fail(std::string sentence);
 
@@ -49,6 +50,10 @@ private:
     RecordingFiles& _files;
     Progress _progress;
     const RecordedTechnology* _technology = nullptr; // that the modem has answered
+    bool _isNewLink = false;                         // no packet has come over it yet
+    std::optional<Time> _first;                      // stamp of the first packet
+    Time _latest;                                    // the latest stamp
+    std::chrono::nanoseconds _shift{0};              // from the source's time to the stamps
     std::optional<std::string> _failure;
     std::uint64_t _packetsTold = 0;
     NoNotices _notices;

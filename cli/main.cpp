@@ -62,6 +62,8 @@ int main(int argc, char** argv) {
     if (argc > 1 && argv[1] == kChildServiceCommand) {
         return runChildService(argc, argv);
     }
-    (void)std::signal(SIGPIPE, SIG_IGN); // a closed pipe is an error of write
+    // A closed pipe, and a file that may not grow, are errors of write.
+    (void)std::signal(SIGPIPE, SIG_IGN);
+    (void)std::signal(SIGXFSZ, SIG_IGN);
     return run({argv + (argc > 0 ? 1 : 0), argv + argc});
 }

@@ -116,6 +116,9 @@ Result<std::unique_ptr<PcapNgWriter>, HostError> PcapNgWriter::create(const std:
     std::unique_ptr<PcapNgWriter> writer(
         new PcapNgWriter(toOutput ? "standard output" : path, std::move(file), number));
     if (auto error = writer->put(sectionHeader())) {
+        if (!toOutput && existing == Existing::Keep) {
+            (void)::unlink(path.c_str()); // made here, and no recording
+        }
         return std::move(*error);
     }
     return writer;

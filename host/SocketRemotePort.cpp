@@ -73,11 +73,13 @@ struct SocketRemotePort::State : std::enable_shared_from_this<State> {
     ByteBuffer unsent;
 };
 
-/// Takes what has arrived; false when the connection has ended.
+/// Takes what has arrived, or, of a peer that never stops, so much that others get their turn and
+/// a deadline is looked at; false when the connection has ended.
 bool SocketRemotePort::State::receive() {
     constexpr std::size_t kChunkSize = std::size_t{16} << 10U;
+    constexpr int kMostChunks = 16;
     std::array<std::uint8_t, kChunkSize> chunk; // NOLINT: filled by the call below
-    for (;;) {
+    for (int count = 0; count < kMostChunks; ++count) {
         const Transfer transfer = receiveFrom(socket, chunk);
         if (transfer.state == Transfer::State::WouldBlock) {
             return true;
@@ -94,6 +96,7 @@ bool SocketRemotePort::State::receive() {
             }
         }
     }
+    return true;
 }
 
 /// False for a frame that the peer must not send.

@@ -2,6 +2,7 @@
 
 #include "host/AsioMainQueue.h"
 #include "host/SocketMessagePorts.h"
+#include "platform/Printable.h"
 #include "telephony/RecordingSource.h"
 #include "telephony/Relay.h"
 #include "telephony/ServiceStatus.h"
@@ -24,7 +25,9 @@ namespace {
 constexpr std::string_view kAsFastAsTakenText = "max";
 
 void complain(const std::string& sentence) {
-    (void)std::fprintf(stderr, "pallax: %s\n", sentence.c_str());
+    std::string harmless; // some name a port, which a client has chosen
+    appendPrintable(harmless, sentence);
+    (void)std::fprintf(stderr, "pallax: %s\n", harmless.c_str());
 }
 
 /// What is served: the technology, and the sources, one for each channel.
@@ -134,7 +137,7 @@ int serve(const ServiceOptions& options, const std::function<void()>& ready,
         complain(program.error().sentence);
         return 1;
     }
-    queue.onSignal({SIGINT, SIGTERM}, [&queue](int /*signal*/) { queue.stop(); });
+    queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [&queue](int /*signal*/) { queue.stop(); });
     auto started = TelephonyServer::start(serverSetup(options, queue, ports, *program));
     if (!started) {
         complain(started.error().sentence);
@@ -166,8 +169,9 @@ std::optional<double> parseSpeed(const std::string& text) {
     double speed = 0;
     const char* end = text.data() + text.size();
     const auto result = std::from_chars(text.data(), end, speed);
+    constexpr double kLeast = 1e-6; // a second in eleven days
     const bool whole = result.ec == std::errc() && result.ptr == end;
-    return whole && std::isfinite(speed) && speed > 0 ? std::optional(speed) : std::nullopt;
+    return whole && std::isfinite(speed) && speed >= kLeast ? std::optional(speed) : std::nullopt;
 }
 
 int runService(const ServiceOptions& options, const std::function<void()>& ready) {

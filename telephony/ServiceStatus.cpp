@@ -2,6 +2,7 @@
 
 #include "platform/Format.h"
 #include "platform/MessagePort.h"
+#include "platform/Printable.h"
 #include "telephony/ControlMessages.h"
 
 #include <chrono>
@@ -102,9 +103,13 @@ std::string statusText(const ServiceStatus& status) {
                                   {status.technology, status.uptimeSeconds, status.sent,
                                    status.dropped, status.clients.size()});
     for (const ServiceStatus::Client& client : status.clients) {
+        const char* state = client.isStreaming ? "streaming"
+                            : client.sent > 0  ? "at the end"
+                                               : "not started";
+        std::string name; // chosen by the client, and shown on a terminal
+        appendPrintable(name, client.localPort);
         text += formatText("  %@: %@, %lld packets sent, %lld dropped\n",
-                           {client.localPort, client.isStreaming ? "streaming" : "not started",
-                            client.sent, client.dropped});
+                           {name, state, client.sent, client.dropped});
     }
     return text;
 }

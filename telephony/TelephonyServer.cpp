@@ -10,6 +10,12 @@
 
 namespace pallax {
 
+namespace {
+
+constexpr const char* kChannelSuffix = ".LogChannel.";
+
+} // namespace
+
 Result<std::unique_ptr<TelephonyServer>, HostError> TelephonyServer::start(Setup setup) {
     std::unique_ptr<TelephonyServer> server(new TelephonyServer(std::move(setup)));
     const Setup& kept = server->_setup;
@@ -45,14 +51,26 @@ std::optional<ByteBuffer> TelephonyServer::answer(Bytes request) {
     return encodeMessage(createLogChannelReply(channel));
 }
 
+/// A channel that fed the service itself would never end.
+bool TelephonyServer::isOwnPort(const std::string& name) const {
+    return name == _setup.controlPortName ||
+           name.starts_with(_setup.controlPortName + kChannelSuffix);
+}
+
 LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
+    if (isOwnPort(localPortName)) {
+        return {kServiceErrorDomain, EINVAL, {}};
+    }
+    if (_channels.size() >= kMostChannels) {
+        return {kServiceErrorDomain, EMFILE, {}};
+    }
     auto source = _setup.makeSource();
     if (!source) {
         report(source.error().sentence);
         return {kServiceErrorDomain, EIO, {}};
     }
     const int number = ++_latestNumber;
-    std::string portName = formatText("%@.LogChannel.%d", {_setup.controlPortName, number});
+    std::string portName = formatText("%@%@%d", {_setup.controlPortName, kChannelSuffix, number});
     std::unique_ptr<ServedChannel> channel;
     const int error = ServedChannel::open(
         ServedChannel::Setup{_setup.queue, _setup.ports, portName, localPortName,

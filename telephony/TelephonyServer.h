@@ -32,6 +32,9 @@ public:
     /// The bytes that wait for a slow client where packets come in their own time.
     static constexpr std::size_t kMostWaiting = std::size_t{1} << 20U;
 
+    /// At the same time; a client that asks for one more is refused.
+    static constexpr std::size_t kMostChannels = 64;
+
     struct Setup {
         AsioMainQueue& queue;
         SocketMessagePorts& ports;
@@ -62,6 +65,7 @@ public:
 private:
     explicit TelephonyServer(Setup setup);
     std::optional<ByteBuffer> answer(Bytes request);
+    bool isOwnPort(const std::string& name) const;
     LogChannel createLogChannel(const std::string& localPortName);
     void removeChannel(int number);
     void report(const std::string& sentence) const;

@@ -145,6 +145,19 @@ TEST_F(PcapNgWriterTest, AFullDiskIsAClearFailure) {
               "The recording /dev/full cannot be written: No space left on device.");
 }
 
+TEST_F(PcapNgWriterTest, AFileThatCannotEvenBeBegunDoesNotStayBehind) {
+    rlimit before{};
+    ::getrlimit(RLIMIT_FSIZE, &before);
+    const rlimit small{10, before.rlim_max};
+    const auto handler = std::signal(SIGXFSZ, SIG_IGN);
+    ::setrlimit(RLIMIT_FSIZE, &small);
+    const auto writer = PcapNgWriter::create(path, Existing::Keep);
+    ::setrlimit(RLIMIT_FSIZE, &before);
+    (void)std::signal(SIGXFSZ, handler);
+    EXPECT_FALSE(writer);
+    EXPECT_NE(::access(path.c_str(), F_OK), 0);
+}
+
 TEST_F(PcapNgWriterTest, WhereAPacketDoesNotFitTheFileEndsWithTheOneBefore) {
     const auto writer = create();
     ASSERT_EQ(write(*writer, ByteBuffer(100)), std::nullopt);

@@ -3,6 +3,7 @@
 
 #include <atomic>
 #include <optional>
+#include <thread>
 
 namespace pallax {
 namespace {
@@ -195,6 +196,32 @@ TEST_F(SocketRemotePortTest, APeerThatSendsNoReplyFrameIsCutOff) {
     const Descriptor accepted = acceptFrom(listener);
     (void)sendTo(accepted, encodeHeader({}, 0)); // a message, to a port that only asks
     ASSERT_TRUE(runUntil(_queue, [&] { return !remote->isValid(); }));
+}
+
+TEST_F(SocketRemotePortTest, APeerThatNeverStopsAnsweringKeepsNoDeadlineWaiting) {
+    const Descriptor listener = listenAt(socketPath("flood"));
+    const auto remote = _ports.createRemote("flood");
+    const Descriptor accepted = acceptFrom(listener);
+    std::atomic<bool> ended = false;
+    std::thread flood([&] {
+        ByteBuffer noReplies; // to a request that nobody has sent
+        for (int count = 0; count < 1000; ++count) {
+            appendFrame(noReplies, {FrameKind::NoReply, 0, 77, std::nullopt}, {});
+        }
+        while (!ended) {
+            (void)sendTo(accepted, noReplies);
+        }
+    });
+    const auto begin = std::chrono::steady_clock::now();
+    const auto outcome = remote->sendRequest({0, {}, 1s, 50ms, true});
+    const auto taken = std::chrono::steady_clock::now() - begin;
+    bool queueGoesOn = false;
+    _queue.async([&] { queueGoesOn = true; });
+    EXPECT_TRUE(runUntil(_queue, [&] { return queueGoesOn; }));
+    ended = true;
+    flood.join();
+    EXPECT_EQ(outcome.error, SendError::ReplyTimedOut);
+    EXPECT_LT(taken, 5s);
 }
 
 TEST_F(SocketRemotePortTest, InvalidateCallsBackBeforeItReturns) {

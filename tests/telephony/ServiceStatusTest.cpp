@@ -56,5 +56,18 @@ TEST(ServiceStatus, IsToldInLines) {
                                   "  recorder: not started, 0 packets sent, 7 dropped\n");
 }
 
+TEST(ServiceStatus, AClientThatHasBeenToldTheEndIsAtTheEnd) {
+    ServiceStatus status;
+    status.clients = {{"viewer", false, 12, 0}};
+    EXPECT_NE(statusText(status).find("  viewer: at the end, 12 packets sent, 0 dropped\n"),
+              std::string::npos);
+}
+
+TEST(ServiceStatus, AClientsNameIsNoCommandToTheTerminal) {
+    ServiceStatus status;
+    status.clients = {{"\x1B[31mred", false, 0, 0}};
+    EXPECT_NE(statusText(status).find("  \uFFFD[31mred: not started"), std::string::npos);
+}
+
 } // namespace
 } // namespace pallax

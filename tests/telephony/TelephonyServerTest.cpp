@@ -154,6 +154,32 @@ TEST_F(TelephonyServerTest, AReceiverThatDoesNotExistIsAnError) {
     EXPECT_EQ(channel.remotePortName, std::nullopt);
 }
 
+TEST_F(TelephonyServerTest, AChannelToThatServiceItselfIsRefused) {
+    start(recordLte(_folder, 1));
+    const LogChannel channel = openChannel();
+    ASSERT_EQ(channel.errorCode, 0);
+    SocketTelephonyService service(_ports);
+    const auto connection = service.connect({});
+    for (const std::string& own : {std::string(kTelephonyControlPort), *channel.remotePortName}) {
+        const LogChannel refused =
+            connection->HXServerConnectionNetworkMonitorCreateLogChannel(own);
+        EXPECT_EQ(refused.errorCode, EINVAL) << own;
+    }
+}
+
+TEST_F(TelephonyServerTest, OneChannelMoreThanTheMostIsRefused) {
+    start(recordLte(_folder, 1));
+    ASSERT_EQ(openChannel().errorCode, 0);
+    SocketTelephonyService service(_ports);
+    const auto connection = service.connect({});
+    for (std::size_t count = 1; count < TelephonyServer::kMostChannels; ++count) {
+        ASSERT_EQ(connection->HXServerConnectionNetworkMonitorCreateLogChannel("viewer").errorCode,
+                  0);
+    }
+    EXPECT_EQ(connection->HXServerConnectionNetworkMonitorCreateLogChannel("viewer").errorCode,
+              EMFILE);
+}
+
 TEST_F(TelephonyServerTest, ARecordingThatHasGoneIsAnErrorAndReported) {
     start(recordLte(_folder, 1));
     ASSERT_EQ(::unlink(_folder.file("lte.pcap").c_str()), 0);

@@ -1,5 +1,7 @@
 #include "telephony/simulator/common/Subscriber.h"
 
+#include <utility>
+
 namespace pallax {
 
 namespace {
@@ -40,6 +42,17 @@ PropertyList simFiles(std::string_view mode, unsigned area) {
         {"kSimFile_OPL", Array()},
         {"kSimFile_OPLMNAcT", Array{"26242"}},
     };
+}
+
+bool SimReading::isDue(const Scenario& scenario) {
+    const Activity::Phase phase = scenario.activity().phase();
+    if (phase == Activity::Phase::Registering || phase == Activity::Phase::Updating) {
+        _isUpdating = true;
+    }
+    // Another cell may lie in an area that is still to be updated.
+    const bool settled = phase == Activity::Phase::Idle && !scenario.hasNewServingCell();
+    const bool updated = settled && std::exchange(_isUpdating, false);
+    return updated || scenario.now().count() == 0;
 }
 
 PropertyList pdpContexts(std::string_view standing, bool session) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/PropertyList.h"
+#include "telephony/simulator/Scenario.h"
 
 #include <string_view>
 
@@ -12,6 +13,17 @@ inline constexpr unsigned kHomeNetwork = 42;
 
 /// The SIM's files. `mode` is what the phone prefers: "LTE preferred".
 PropertyList simFiles(std::string_view mode, unsigned area);
+
+/// When the SIM's files are read anew: they tell the area, so after each update of it.
+class SimReading {
+public:
+    /// True at power-on, and when the phone is idle again after it has registered or updated. To be
+    /// asked at every step.
+    bool isDue(const Scenario& scenario);
+
+private:
+    bool _isUpdating = false;
+};
 
 /// The packet-data contexts: one that is always there, and, during a session, another one.
 /// `standing` is its access point name.

@@ -127,9 +127,7 @@ void encodeServingPlmn(const Scenario& scenario, ByteBuffer& out) {
            out);
 }
 
-void queuePowerOn(const Scenario& scenario, RecordQueue& queue) {
-    const unsigned area = scenario.serving().campedCell().area;
-    encodePropertyList(kSimFilesCode, simFiles("UMTS preferred", area), ListForm::Xml, queue.add());
+void queuePowerOn(RecordQueue& queue) {
     encodePropertyList(kPdpContextsCode, pdpContexts("mms", false), ListForm::Binary, queue.add());
 }
 
@@ -148,7 +146,9 @@ void queuePhase(const Scenario& scenario, RecordQueue& queue) {
         encodePropertyList(kPdpContextsCode, pdpContexts("mms", phase == Phase::Connected),
                            ListForm::Binary, queue.add());
     }
-    if (onGsm(scenario) && phase == Phase::Connected) {
+    const bool hasChannel = phase == Phase::Registering || phase == Phase::Updating ||
+                            phase == Phase::Connecting || phase == Phase::Connected;
+    if (onGsm(scenario) && hasChannel) {
         queueDedicatedChannel(scenario, queue);
     }
 }
@@ -163,14 +163,16 @@ void queueServingCell(const Scenario& scenario, RecordQueue& queue) {
         encodeServingPlmn(scenario, queue.add()); // the cell may lie in another area
     }
     if (changesLayer) {
-        if (!onGsm(scenario)) {
+        if (onGsm(scenario)) { // what was left has no connection any more
+            encode(RrcState::Disconnected, queue.add());
+        } else {
             encode(RrInfo{RrState::Inactive, 0, 0, true}, queue.add());
         }
         queueRadioState(scenario, queue);
     }
     if (onGsm(scenario)) {
         queueBroadcast(scenario, queue);
-        if (scenario.activity().isConnected() || scenario.hasNewLayer()) {
+        if (scenario.activity().isConnected()) {
             queueDedicatedChannel(scenario, queue);
         }
         return;

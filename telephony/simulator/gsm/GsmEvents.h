@@ -5,7 +5,7 @@
 /// The records of what happens to a GSM/UMTS phone: registration, sessions, cell changes.
 namespace pallax::gsm {
 
-void queuePowerOn(const Scenario& scenario, RecordQueue& queue);
+void queuePowerOn(RecordQueue& queue);
 /// The latest step has brought another phase.
 void queuePhase(const Scenario& scenario, RecordQueue& queue);
 /// The latest step has brought another serving cell, and maybe the other technology.

@@ -41,8 +41,13 @@ ScenarioPlan GsmModem::plan() {
 }
 
 void GsmModem::observe(const Scenario& scenario, RecordQueue& queue) {
+    const unsigned area = scenario.serving().campedCell().area;
+    if (_simReading.isDue(scenario)) {
+        encodePropertyList(kSimFilesCode, simFiles("UMTS preferred", area), ListForm::Xml,
+                           queue.add());
+    }
     if (scenario.now().count() == 0) {
-        gsm::queuePowerOn(scenario, queue);
+        gsm::queuePowerOn(queue);
     }
     if (scenario.hasNewServingCell()) {
         gsm::queueServingCell(scenario, queue);

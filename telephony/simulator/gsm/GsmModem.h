@@ -2,6 +2,7 @@
 
 #include "telephony/simulator/Modem.h"
 #include "telephony/simulator/ReportMix.h"
+#include "telephony/simulator/common/Subscriber.h"
 
 namespace pallax {
 
@@ -34,6 +35,7 @@ private:
     void reportNetwork(const Scenario& scenario, ByteBuffer& out);
 
     ReportMix<kKindCount> _mix;
+    SimReading _simReading;
     unsigned _monitorTurn = 0;
     unsigned _networkTurn = 0;
 };

@@ -58,11 +58,12 @@ double ecno_db(const Scenario& scenario, double level_dbm) {
 void reportSearcher(const Scenario& scenario, Random& random, ByteBuffer& out) {
     const RadioLayer& layer = scenario.layer(GsmModem::kUmts);
     const double carrier_dbm = layer.campedLevel_dbm() - ecno_db(scenario, layer.campedLevel_dbm());
+    const bool serves = scenario.servingLayer() == GsmModem::kUmts;
     std::array<SearchedCell, kMostCells> cells{};
     std::size_t count = 0;
     visitCells(scenario, [&](std::size_t index) {
         const double ecno = ecno_db(scenario, layer.level_dbm(index));
-        cells[count++] = {layer.cells()[index].code, index == layer.camped(),
+        cells[count++] = {layer.cells()[index].code, serves && index == layer.camped(),
                           std::clamp(whole(measured(ecno, kNoiseDb, random)), -22, -1)};
     });
     encode(Searcher{whole(carrier_dbm), std::span(cells.data(), count)}, out);

@@ -110,7 +110,7 @@ std::optional<ifx::DedicatedChannel> dedicatedChannel(const Scenario& scenario, 
 ScenarioPlan IfxModem::plan() {
     ScenarioPlan plan;
     plan.layers = {{.firstChannel = 11,
-                    .channelStep = 4,
+                    .channelStep = 3, // and the hopping stays in the band
                     .channelCount = 25,
                     .codeCount = 64,
                     .firstIdentity = 20817,

@@ -205,9 +205,11 @@ ScenarioPlan LteModem::plan() {
 void LteModem::observe(const Scenario& scenario, RecordQueue& queue) {
     const Activity& activity = scenario.activity();
     const Cell& cell = scenario.layer(kLte).campedCell();
-    if (scenario.now().count() == 0) {
+    if (_simReading.isDue(scenario)) {
         encodePropertyList(kSimFilesCode, simFiles("LTE preferred", cell.area), ListForm::Xml,
                            queue.add());
+    }
+    if (scenario.now().count() == 0) {
         encodePropertyList(kPdpContextsCode, pdpContexts("ims", false), ListForm::Binary,
                            queue.add());
     }

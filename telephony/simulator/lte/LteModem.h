@@ -2,6 +2,7 @@
 
 #include "telephony/simulator/Modem.h"
 #include "telephony/simulator/ReportMix.h"
+#include "telephony/simulator/common/Subscriber.h"
 
 #include <memory>
 
@@ -22,6 +23,7 @@ private:
     void reportCellMonitor(const Scenario& scenario, ByteBuffer& out);
 
     ReportMix<kKindCount> _mix;
+    SimReading _simReading;
     unsigned _candidateTurn = 0;
     unsigned _monitorTurn = 0;
 };

@@ -159,10 +159,12 @@ void UtranModem::choosePhaseMode(Phase phase) {
 
 void UtranModem::observe(const Scenario& scenario, RecordQueue& queue) {
     const Phase phase = scenario.activity().phase();
-    if (scenario.now().count() == 0) {
-        const unsigned area = scenario.layer(kUtran).campedCell().area;
+    const unsigned area = scenario.layer(kUtran).campedCell().area;
+    if (_simReading.isDue(scenario)) {
         encodePropertyList(kSimFilesCode, simFiles("UTRAN preferred", area), ListForm::Binary,
                            queue.add());
+    }
+    if (scenario.now().count() == 0) {
         encodePropertyList(kPdpContextsCode, pdpContexts("mms", false), ListForm::Xml, queue.add());
     }
     if (scenario.hasNewServingCell() ||

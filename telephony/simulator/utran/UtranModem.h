@@ -2,6 +2,7 @@
 
 #include "telephony/simulator/Modem.h"
 #include "telephony/simulator/ReportMix.h"
+#include "telephony/simulator/common/Subscriber.h"
 #include "telephony/simulator/utran/UtranRecords.h"
 
 namespace pallax {
@@ -21,6 +22,7 @@ private:
 
     ReportMix<kKindCount> _mix;
     utran::RrcMode _mode = utran::RrcMode::Disconnected;
+    SimReading _simReading;
     unsigned _sessions = 0;
     unsigned _monitorTurn = 0;
 };

@@ -187,5 +187,67 @@ TEST(Consistency, TheServingIfxCellIsNotItsOwnNeighbour) {
     });
 }
 
+TEST(Consistency, OnGsmThereIsNeitherAnUmtsConnectionNorAnActiveUmtsCell) {
+    constexpr std::uint32_t kSearcher = 0x4005;
+    std::size_t idle = 0;
+    std::size_t searched = 0;
+    std::string before;
+    inEveryDrive({"gsm", seconds(60), kRate}, [&](const DriveMoment& moment) {
+        const DecodedDisplay& decoded = moment.decoded;
+        const std::string state = decoded.text("GSM RR Info", "RR State");
+        const bool onGsm = state == "RR_IDLE" && before == state;
+        if (onGsm) {
+            const std::string connection = decoded.text("UMTS RR Info", "RRC State");
+            EXPECT_TRUE(connection == "(absent)" || connection == "Disconnected") << connection;
+            ++idle;
+        }
+        if (onGsm && moment.code == kSearcher) {
+            EXPECT_TRUE(decoded.texts("Active Set", "Scrambling Code").empty());
+            ++searched;
+        }
+        before = state;
+    });
+    EXPECT_GT(idle, 0U);
+    EXPECT_GT(searched, 0U);
+}
+
+TEST(Consistency, TheSimTellsTheAreaInWhichThePhoneHasRegistered) {
+    constexpr std::uint32_t kSimFiles = 0xFF0000;
+    constexpr std::size_t kAreaOffset = 7; // in the file: identity and network stand before
+    std::size_t compared = 0;
+    inEveryDrive({"lte", seconds(120), kRate}, [&](const DriveMoment& moment) {
+        if (moment.code != kSimFiles) {
+            return;
+        }
+        const std::string known = moment.decoded.text("Serving Cell Info", "Tracking Area Code");
+        const SharedBytes file =
+            moment.decoded.section("SIM Info").dictionary()->find("EF-LOCI")->data();
+        ASSERT_TRUE(file != nullptr && file->size() > kAreaOffset + 1);
+        const unsigned area = (*file)[kAreaOffset] * 256U + (*file)[kAreaOffset + 1];
+        if (known != "(absent)") {
+            EXPECT_EQ(known, std::to_string(area));
+            ++compared;
+        }
+    });
+    EXPECT_GT(compared, std::size_t{PALLAX_DRIVES}) << "more than once in a drive";
+}
+
+TEST(Consistency, AnIfxCallHopsWithinTheBand) {
+    constexpr int kHighestArfcn = 124;
+    std::size_t compared = 0;
+    inEveryDrive({"ifx", seconds(60), kRate}, [&](const DriveMoment& moment) {
+        const DictionaryRef channel = moment.decoded.section("Dedicated Channel").dictionary();
+        const PropertyList* hopping = channel != nullptr ? channel->find("Hopping") : nullptr;
+        if (hopping == nullptr) {
+            return;
+        }
+        for (const PropertyList& each : *hopping->array()) {
+            EXPECT_LE(std::atoi(each.string()->c_str()), kHighestArfcn);
+            ++compared;
+        }
+    });
+    EXPECT_GT(compared, 0U);
+}
+
 } // namespace
 } // namespace pallax
