@@ -45,8 +45,10 @@ void ZORLogGenerator::capture(Bytes packet) {
 }
 
 void ZORLogGenerator::handOverCapture(Dictionary& state) {
+    const std::size_t captured = _binData->size();
     state.setFixed("DisplayState", SharedBytes(std::move(_binData)));
     _binData = std::make_shared<ByteBuffer>();
+    _binData->reserve(captured); // the next one will be of about that size
 }
 
 std::optional<ByteBuffer> ZORLogGenerator::generateDlfFromState(const Dictionary& state) const {

@@ -51,7 +51,8 @@ void ZORLogGenerator2::updateWithData(Bytes data) {
     if (cIndex == nullptr) {
         return;
     }
-    const LogRecord record(LogPacketStripPrefix(data));
+    SharedPayload payload;
+    const LogRecord record(LogPacketStripPrefix(data), payload);
     if (!record.has(LogRecord::kHeaderLength)) {
         systemLog(LogPriority::Warning, "Invalid data packet len=%lu expected=%lu", record.length(),
                   LogRecord::kHeaderLength);

@@ -1,26 +1,127 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "cli/DroppedNotices.h"
+#include "cli/OrderedWorkers.h"
 #include "cli/Preconditions.h"
 #include "cli/Programs.h"
 #include "cli/ScopedLog.h"
 #include "host/BuildBundle.h"
 #include "host/DirectoryResources.h"
 #include "host/LogSinks.h"
+#include "platform/Format.h"
 
+#include <algorithm>
+#include <cstdio>
+#include <thread>
 #include <unistd.h>
 
 namespace pallax {
 
 namespace {
 
-ExitStatus decodeTo(int descriptor, const DecodeOptions& options) {
+/// Gives the command, wired to this machine, to `use`.
+template <class Use>
+ExitStatus withCommand(const DecodeOptions& options, const Use& use) {
     const DirectoryResources resources(DirectoryResources::programFolder());
     const BuildBundle bundle;
     DroppedNotices notices;
-    Output output(writeToDescriptor(descriptor, "Standard output"));
     DecodeCommand command(options, {resources, bundle, notices, technologies()}, Recording::open,
                           complain);
-    return command.run(output);
+    return use(command);
+}
+
+ExitStatus decodeOneByOne(const DecodeOptions& options) {
+    Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
+    return withCommand(options, [&](DecodeCommand& command) { return command.run(output); });
+}
+
+/// A worker's piece of the work, into its files.
+ExitStatus decodeInWorker(const DecodeOptions& options, std::size_t recording,
+                          const WorkerFiles& files) {
+    const auto decode = [&] {
+        Output output(writeToDescriptor(STDOUT_FILENO, "A temporary file"));
+        return withCommand(
+            options, [&](DecodeCommand& command) { return command.runOne(recording, output); });
+    };
+    if (!options.systemLog) {
+        return decode();
+    }
+    const auto sink = FileSink::onto(files.systemLog.number());
+    if (!sink) {
+        complain(sink.error().sentence);
+        return kExitFailure;
+    }
+    ExitStatus status = kExitFailure;
+    {
+        const ScopedLog log(**sink);
+        status = decode();
+    }
+    if (!(*sink)->flush()) {
+        complain("A temporary file for the system log cannot be written.");
+        return status == kExitSuccess ? kExitFailure : status;
+    }
+    return status;
+}
+
+/// What the recordings give, in their order, as decoding one by one would have written it.
+class DecodeCollector {
+public:
+    DecodeCollector(const DecodeOptions& options, FileSink* log) : _options(options), _log(log) {}
+
+    ExitStatus status() const { return _status; }
+
+    bool collect(std::size_t recording, const OrderedWorkers::Outcome& outcome,
+                 const WorkerFiles& files) {
+        readWhole(files.output, writeToDescriptor(STDOUT_FILENO, "Standard output"));
+        readWhole(files.complaints, [](std::string_view sentences) {
+            (void)std::fwrite(sentences.data(), 1, sentences.size(), stderr);
+        });
+        if (_log != nullptr) {
+            readWhole(files.systemLog, [this](std::string_view lines) { _log->append(lines); });
+        }
+        if (outcome.signal != 0) {
+            complain(formatText("%@: the process that decoded it was ended by signal %d.",
+                                {_options.recordings.at(recording), outcome.signal}));
+        }
+        _status = outcome.status == kExitSuccess ? _status : outcome.status;
+        return !outcome.gaveUp && outcome.status != kExitFatalRecord;
+    }
+
+private:
+    const DecodeOptions& _options;
+    FileSink* _log;
+    ExitStatus _status = kExitSuccess;
+};
+
+ExitStatus decodeAtOnce(const DecodeOptions& options, unsigned jobs, FileSink* log) {
+    OrderedWorkers workers(options.recordings.size(), jobs,
+                           [&options](std::size_t recording, const WorkerFiles& files) {
+                               return decodeInWorker(options, recording, files);
+                           });
+    DecodeCollector collector(options, log);
+    const auto error = workers.run(
+        [&collector](std::size_t recording, const auto& outcome, const WorkerFiles& files) {
+            return collector.collect(recording, outcome, files);
+        });
+    if (error) {
+        complain(error->sentence);
+        return kExitFailure;
+    }
+    return collector.status();
+}
+
+/// How many processes decode. Standard input may be live: what it gives must not wait for its end.
+unsigned jobsFor(const DecodeOptions& options) {
+    const auto& recordings = options.recordings;
+    if (recordings.size() < 2 ||
+        std::find(recordings.begin(), recordings.end(), "-") != recordings.end()) {
+        return 1;
+    }
+    return options.jobs.value_or(std::thread::hardware_concurrency());
+}
+
+ExitStatus decodeAll(const DecodeOptions& options, FileSink* log) {
+    const unsigned jobs = jobsFor(options);
+    return jobs > 1 ? decodeAtOnce(options, jobs, log) : decodeOneByOne(options);
 }
 
 } // namespace
@@ -31,7 +132,7 @@ ExitStatus runDecode(const DecodeOptions& options) {
         return kExitFailure;
     }
     if (!options.systemLog) {
-        return decodeTo(STDOUT_FILENO, options);
+        return decodeAll(options, nullptr);
     }
     const auto sink = FileSink::create(*options.systemLog);
     if (!sink) {
@@ -39,7 +140,7 @@ ExitStatus runDecode(const DecodeOptions& options) {
         return kExitFailure;
     }
     const ScopedLog log(**sink);
-    const ExitStatus status = decodeTo(STDOUT_FILENO, options);
+    const ExitStatus status = decodeAll(options, sink->get());
     if (!(*sink)->flush()) {
         complain("The system log cannot be written to " + *options.systemLog + ".");
         return status == kExitSuccess ? kExitFailure : status;

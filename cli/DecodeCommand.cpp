@@ -7,9 +7,10 @@ namespace pallax {
 
 namespace {
 
-std::unique_ptr<DisplayOutput> displayOutput(const DecodeOptions& options, Output& output) {
+std::unique_ptr<DisplayOutput> displayOutput(const DecodeOptions& options, Output& output,
+                                             bool withHeader) {
     if (options.format == DecodeFormat::Csv) {
-        return std::make_unique<CsvOutput>(output);
+        return std::make_unique<CsvOutput>(output, withHeader);
     }
     return std::make_unique<JsonOutput>(output, options.chosenEvery());
 }
@@ -17,7 +18,7 @@ std::unique_ptr<DisplayOutput> displayOutput(const DecodeOptions& options, Outpu
 } // namespace
 
 ExitStatus DecodeCommand::run(Output& output) {
-    const auto displays = displayOutput(_options, output);
+    const auto displays = displayOutput(_options, output, true);
     ExitStatus status = kExitSuccess;
     for (const std::string& path : _options.recordings) {
         const ExitStatus result = decodePath(path, *displays);
@@ -26,6 +27,13 @@ ExitStatus DecodeCommand::run(Output& output) {
             break;
         }
     }
+    output.flush();
+    return status;
+}
+
+ExitStatus DecodeCommand::runOne(std::size_t recording, Output& output) {
+    const auto displays = displayOutput(_options, output, recording == 0);
+    const ExitStatus status = decodePath(_options.recordings.at(recording), *displays);
     output.flush();
     return status;
 }

@@ -4,6 +4,7 @@
 #include "cli/RecordingDecoder.h"
 #include "host/Recording.h"
 
+#include <cstddef>
 #include <functional>
 #include <optional>
 #include <string>
@@ -23,6 +24,8 @@ struct DecodeOptions {
     DecodeFormat format = DecodeFormat::Json;
     std::optional<std::string> systemLog; ///< path of a text file
     bool strict = false;
+    /// How many recordings are decoded at once; nothing: one on each core.
+    std::optional<unsigned> jobs;
 
     Every chosenEvery() const {
         return every.value_or(format == DecodeFormat::Csv ? Every::Tick : Every::End);
@@ -45,6 +48,9 @@ public:
 
     /// Writes to `output`, whose exceptions leave.
     ExitStatus run(Output& output);
+    /// The same for one of the recordings, by its place; only the first writes what stands at the
+    /// head of the whole output.
+    ExitStatus runOne(std::size_t recording, Output& output);
 
 private:
     ExitStatus decodePath(const std::string& path, DisplayOutput& output);

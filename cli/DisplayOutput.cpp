@@ -6,7 +6,6 @@
 #include "platform/Printable.h"
 
 #include <cmath>
-#include <tuple>
 
 namespace pallax {
 
@@ -78,6 +77,16 @@ std::string cellsOf(const PropertyList& value) {
     return cells;
 }
 
+/// For certain, without the texts being made: false may still mean the same text.
+bool isSameText(const PropertyList& a, const PropertyList& b) {
+    const DisplayNumber* number = a.displayNumber();
+    const DisplayNumber* otherNumber = b.displayNumber();
+    if (number != nullptr && otherNumber != nullptr) {
+        return number->sameNumberAndFormat(*otherNumber);
+    }
+    return a.text() != nullptr && b.text() != nullptr && *a.text() == *b.text();
+}
+
 } // namespace
 
 void JsonOutput::show(const DisplayMoment& moment, const PropertyList& display) {
@@ -97,12 +106,16 @@ void JsonOutput::show(const DisplayMoment& moment, const PropertyList& display) 
     _output.lineDone();
 }
 
-CsvOutput::CsvOutput(Output& output) : _output(output) {
-    _output.text() += kHeader;
+CsvOutput::CsvOutput(Output& output, bool withHeader) : _output(output) {
+    if (withHeader) {
+        _output.text() += kHeader;
+    }
 }
 
 void CsvOutput::show(const DisplayMoment& moment, const PropertyList& display) {
     ++_display;
+    _before.swap(_order);
+    _order.clear();
     _time = isoTimeText(moment.time);
     showValue("/", display);
     for (auto at = _shown.begin(); at != _shown.end();) {
@@ -134,18 +147,38 @@ void CsvOutput::showValue(const std::string& path, const PropertyList& value) {
 }
 
 void CsvOutput::showLeaf(const std::string& path, const PropertyList& value) {
-    std::pair<std::string, int> key(path, 0);
-    auto [shown, isNew] = _shown.try_emplace(key);
-    while (!isNew && shown->second.display == _display) {
-        ++key.second;
-        std::tie(shown, isNew) = _shown.try_emplace(key);
+    const auto row = rowOf(path);
+    _order.push_back(row);
+    Shown& shown = row->second;
+    const bool isNew = shown.display == 0;
+    shown.display = _display;
+    if (!isNew && isSameText(shown.value, value)) {
+        return;
     }
-    shown->second.display = _display;
     std::string cells = cellsOf(value);
-    if (isNew || shown->second.cells != cells) {
+    if (isNew || shown.cells != cells) {
         writeRow(path, cells);
-        shown->second.cells = std::move(cells);
+        shown.cells = std::move(cells);
     }
+    shown.value = value;
+}
+
+/// The row of the next node at a path; a new one has no display yet.
+CsvOutput::Rows::iterator CsvOutput::rowOf(const std::string& path) {
+    if (_order.size() < _before.size()) {
+        const auto next = _before[_order.size()];
+        if (next->first.second == 0 && next->first.first == path &&
+            next->second.display != _display) {
+            return next;
+        }
+    }
+    std::pair<std::string, int> key(path, 0);
+    auto row = _shown.try_emplace(key).first;
+    while (row->second.display == _display) {
+        ++key.second;
+        row = _shown.try_emplace(key).first;
+    }
+    return row;
 }
 
 void CsvOutput::writeRow(std::string_view path, std::string_view cells) {

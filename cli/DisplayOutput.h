@@ -9,6 +9,7 @@
 #include <string>
 #include <string_view>
 #include <utility>
+#include <vector>
 
 namespace pallax {
 
@@ -52,24 +53,36 @@ private:
 /// one that is not finite).
 class CsvOutput final : public DisplayOutput {
 public:
-    explicit CsvOutput(Output& output);
+    /// Without its header the table goes on after another one.
+    explicit CsvOutput(Output& output, bool withHeader = true);
 
-    void beginRecording() override { _shown.clear(); }
+    void beginRecording() override {
+        _before.clear();
+        _order.clear();
+        _shown.clear();
+    }
     void show(const DisplayMoment& moment, const PropertyList& display) override;
 
 private:
     struct Shown {
+        PropertyList value;
         std::string cells; ///< "value,number,unit" as written
         std::uint64_t display = 0;
     };
+    /// By path and count of earlier nodes of the same path in the display.
+    using Rows = std::map<std::pair<std::string, int>, Shown>;
 
     void showValue(const std::string& path, const PropertyList& value);
     void showLeaf(const std::string& path, const PropertyList& value);
+    Rows::iterator rowOf(const std::string& path);
     void writeRow(std::string_view path, std::string_view cells);
 
     Output& _output;
-    /// By path and count of earlier nodes of the same path in the display.
-    std::map<std::pair<std::string, int>, Shown> _shown;
+    Rows _shown;
+    /// The rows of the previous display and of this one in their order: the next row is mostly the
+    /// one that came next before, and need not be searched.
+    std::vector<Rows::iterator> _before;
+    std::vector<Rows::iterator> _order;
     std::uint64_t _display = 0;
     std::string _time;
 };

@@ -5,7 +5,9 @@
 #include <CLI/CLI.hpp>
 
 #include <algorithm>
+#include <charconv>
 #include <string>
+#include <system_error>
 #include <utility>
 #include <vector>
 
@@ -30,6 +32,20 @@ CLI::Option* addChoice(CLI::App& app, const std::string& name, Value& value,
         value = found->second;
     };
     return app.add_option_function<std::string>(name, take, description)->type_name(names);
+}
+
+/// A whole number within bounds; CLI11's own takes "-1" for a large one.
+template <class Value>
+Value numberOf(const char* option, const std::string& text, Value least, Value most) {
+    Value number{};
+    const char* end = text.data() + text.size();
+    const auto result = std::from_chars(text.data(), end, number);
+    if (result.ec != std::errc() || result.ptr != end || number < least || number > most) {
+        throw CLI::ValidationError(option, "\"" + text + "\" is no whole number from " +
+                                               std::to_string(least) + " to " +
+                                               std::to_string(most));
+    }
+    return number;
 }
 
 /// --speed X|max.

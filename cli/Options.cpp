@@ -118,6 +118,14 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
                             "JSON, one object a line, or CSV (default: json)");
     app.add_option("--system-log", options.systemLog, "Write every system-log line to this file")
         ->type_name("FILE");
+    constexpr unsigned kMostJobs = 1024;
+    app.add_option_function<std::string>(
+           "--jobs",
+           [&options](const std::string& text) {
+               options.jobs = numberOf("--jobs", text, 1U, kMostJobs);
+           },
+           "How many recordings to decode at once (default: as many as there are cores)")
+        ->type_name("N");
     app.add_flag("--strict", options.strict,
                  "End with status 70 at a record that cannot be read instead of skipping it");
     app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")

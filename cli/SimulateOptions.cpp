@@ -3,7 +3,6 @@
 #include "cli/OptionParts.h"
 #include "host/Recording.h"
 
-#include <charconv>
 #include <cstdint>
 #include <limits>
 #include <string_view>
@@ -26,20 +25,6 @@ constexpr const char* kSimulateFooter = R"(Examples:
 The same technology, seed, rate and duration give the same file. An existing file is replaced.)";
 
 constexpr const char* kUntilWhen = "End after so many simulated seconds (default: never)";
-
-/// A whole number within bounds; CLI11's own takes "-1" for a large one.
-template <class Value>
-Value numberOf(const char* option, const std::string& text, Value least, Value most) {
-    Value number{};
-    const char* end = text.data() + text.size();
-    const auto result = std::from_chars(text.data(), end, number);
-    if (result.ec != std::errc() || result.ptr != end || number < least || number > most) {
-        throw CLI::ValidationError(option, "\"" + text + "\" is no whole number from " +
-                                               std::to_string(least) + " to " +
-                                               std::to_string(most));
-    }
-    return number;
-}
 
 CLI::Option* addSeed(CLI::App& app, const std::function<void(std::uint64_t)>& take) {
     return app

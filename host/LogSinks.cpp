@@ -4,6 +4,7 @@
 
 #include <cerrno>
 #include <cstring>
+#include <fcntl.h>
 #include <syslog.h>
 #include <unistd.h>
 
@@ -60,12 +61,29 @@ Result<std::unique_ptr<FileSink>, HostError> FileSink::create(const std::string&
     return std::unique_ptr<FileSink>(new FileSink(file));
 }
 
+Result<std::unique_ptr<FileSink>, HostError> FileSink::onto(int descriptor) {
+    const int duplicate = ::fcntl(descriptor, F_DUPFD_CLOEXEC, 0);
+    std::FILE* file = duplicate >= 0 ? ::fdopen(duplicate, "w") : nullptr;
+    if (file == nullptr) {
+        const int reason = errno;
+        if (duplicate >= 0) {
+            (void)::close(duplicate);
+        }
+        return HostError{formatText("The log cannot be written: %@.", {std::strerror(reason)})};
+    }
+    return std::unique_ptr<FileSink>(new FileSink(file));
+}
+
 FileSink::~FileSink() {
     (void)std::fclose(_file);
 }
 
 void FileSink::write(LogPriority priority, std::string_view text) {
     writeTo(_file, priority, text);
+}
+
+void FileSink::append(std::string_view lines) {
+    (void)std::fwrite(lines.data(), 1, lines.size(), _file);
 }
 
 bool FileSink::flush() {

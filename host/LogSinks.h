@@ -46,10 +46,14 @@ private:
 class FileSink final : public LogSink {
 public:
     static Result<std::unique_ptr<FileSink>, HostError> create(const std::string& path);
+    /// On a descriptor, of which it uses a duplicate.
+    static Result<std::unique_ptr<FileSink>, HostError> onto(int descriptor);
     ~FileSink() override;
     FileSink(const FileSink&) = delete;
     FileSink& operator=(const FileSink&) = delete;
     void write(LogPriority priority, std::string_view text) override;
+    /// Lines as another sink has written them.
+    void append(std::string_view lines);
     /// Writes what is buffered; false when any line could not be written.
     bool flush();
 

@@ -10,8 +10,8 @@ namespace pallax {
 
 namespace {
 
-// Up to this many entries a linear search beats hashing; sections have at most about 20.
-constexpr std::size_t kIndexedFrom = 32;
+// With fewer entries a linear search beats hashing; sections have at most about 20.
+constexpr std::size_t kIndexedFrom = 24;
 
 bool equalStrings(const PropertyList& a, const PropertyList& b) {
     const DisplayNumber* left = a.displayNumber();
@@ -134,16 +134,6 @@ SharedBytes PropertyList::data() const {
     return data != nullptr ? *data : nullptr;
 }
 
-ArrayRef PropertyList::array() const {
-    const auto* array = std::get_if<ArrayRef>(&_value);
-    return array != nullptr ? *array : nullptr;
-}
-
-DictionaryRef PropertyList::dictionary() const {
-    const auto* dictionary = std::get_if<DictionaryRef>(&_value);
-    return dictionary != nullptr ? *dictionary : nullptr;
-}
-
 std::optional<std::int32_t> PropertyList::int32() const {
     constexpr auto kLeast = std::numeric_limits<std::int32_t>::min();
     constexpr auto kLargest = std::numeric_limits<std::int32_t>::max();
@@ -193,10 +183,6 @@ bool operator==(const PropertyList& a, const PropertyList& b) {
     }
 }
 
-Dictionary::Dictionary(const Dictionary& other) = default;
-Dictionary::Dictionary(Dictionary&& other) noexcept = default;
-Dictionary& Dictionary::operator=(const Dictionary& other) = default;
-Dictionary& Dictionary::operator=(Dictionary&& other) noexcept = default;
 Dictionary::~Dictionary() = default;
 
 Dictionary::Dictionary(std::initializer_list<std::pair<const char*, PropertyList>> entries) {
@@ -206,13 +192,42 @@ Dictionary::Dictionary(std::initializer_list<std::pair<const char*, PropertyList
     }
 }
 
+Dictionary::Dictionary(const Dictionary& other) : _entries(other._entries) {
+    rebuildIndex();
+}
+
+Dictionary::Dictionary(Dictionary&& other) noexcept
+    : _entries(std::move(other._entries)), _index(std::move(other._index)) {
+    other.truncate(0);
+}
+
+Dictionary& Dictionary::operator=(const Dictionary& other) {
+    return *this = Dictionary(other);
+}
+
+Dictionary& Dictionary::operator=(Dictionary&& other) noexcept {
+    _entries.swap(other._entries);
+    _index.swap(other._index);
+    _next = 0;
+    other.truncate(0);
+    return *this;
+}
+
+void Dictionary::truncate(std::size_t count) {
+    if (count < _entries.size()) {
+        _entries.erase(_entries.begin() + static_cast<std::ptrdiff_t>(count), _entries.end());
+        rebuildIndex();
+    }
+    _next = 0;
+}
+
 std::size_t Dictionary::indexOf(std::string_view key) const {
-    if (_entries.size() >= kIndexedFrom) {
-        const auto found = _index.find(key);
-        return found != _index.end() ? found->second : kNotFound;
+    if (_index != nullptr) {
+        const auto found = _index->find(key);
+        return found != _index->end() ? found->second : kNotFound;
     }
     for (std::size_t at = 0; at < _entries.size(); ++at) {
-        if (_entries[at].key.view() == key && _entries[at].hasStringKey) {
+        if (isAt(at, key)) {
             return at;
         }
     }
@@ -224,30 +239,38 @@ const PropertyList* Dictionary::find(std::string_view key) const {
     return at != kNotFound ? &_entries[at].value : nullptr;
 }
 
-void Dictionary::append(Entry entry) {
-    _entries.push_back(std::move(entry));
+void Dictionary::append(Text key, PropertyList value, bool isStringKey) {
+    _entries.emplace_back(std::move(key), std::move(value), isStringKey);
     if (_entries.size() == kIndexedFrom) {
         rebuildIndex();
-    } else if (_entries.size() > kIndexedFrom && _entries.back().hasStringKey) {
-        _index.emplace(_entries.back().key.view(), _entries.size() - 1);
+    } else if (_index != nullptr && isStringKey) {
+        _index->emplace(_entries.back().key.view(), _entries.size() - 1);
     }
 }
 
 void Dictionary::set(Text key, PropertyList value) {
-    const std::size_t at = indexOf(key.view());
+    const bool isNext = _next < _entries.size() && isAt(_next, key.view());
+    const std::size_t at = isNext ? _next : indexOf(key.view());
     if (at != kNotFound) {
         _entries[at].value = std::move(value);
+        _next = at + 1;
     } else {
-        append({std::move(key), std::move(value)});
+        append(std::move(key), std::move(value), true);
     }
 }
 
-void Dictionary::setFixed(std::string_view key, PropertyList value) {
-    set(Text::fixed(key), std::move(value));
+PropertyList& Dictionary::searchedOrAppended(std::string_view key) {
+    const std::size_t at = indexOf(key);
+    if (at == kNotFound) {
+        append(Text::fixed(key), {}, true);
+        return _entries.back().value;
+    }
+    _next = at + 1;
+    return _entries[at].value;
 }
 
 void Dictionary::appendForeignKey(const PropertyList& key, PropertyList value) {
-    append({key.description(), std::move(value), false});
+    append(key.description(), std::move(value), false);
 }
 
 bool Dictionary::remove(std::string_view key) {
@@ -261,13 +284,14 @@ bool Dictionary::remove(std::string_view key) {
 }
 
 void Dictionary::rebuildIndex() {
-    _index.clear();
+    _index.reset();
     if (_entries.size() < kIndexedFrom) {
         return;
     }
+    _index = std::make_unique<Index>();
     for (std::size_t at = 0; at < _entries.size(); ++at) {
         if (_entries[at].hasStringKey) {
-            _index.emplace(_entries[at].key.view(), at);
+            _index->emplace(_entries[at].key.view(), at);
         }
     }
 }

@@ -80,6 +80,8 @@ public:
     std::optional<std::string> string() const;
     /// Appends the text of a string; false (and nothing appended) for any other type.
     bool appendString(std::string& out) const;
+    /// The text of a string that is no display number, or null for everything else.
+    const Text* text() const { return std::get_if<Text>(&_value); }
     /// The number behind a display string, or null for everything else.
     const DisplayNumber* displayNumber() const { return std::get_if<DisplayNumber>(&_value); }
 
@@ -87,9 +89,21 @@ public:
     std::optional<double> real() const { return get<double>(); }
     std::optional<bool> boolean() const { return get<bool>(); }
     std::optional<Date> date() const { return get<Date>(); }
-    SharedBytes data() const;         ///< null when this is no data value
-    ArrayRef array() const;           ///< null when this is no array
-    DictionaryRef dictionary() const; ///< null when this is no dictionary
+    SharedBytes data() const; ///< null when this is no data value
+    /// Null when this is no array.
+    ArrayRef array() const {
+        const auto* array = std::get_if<ArrayRef>(&_value);
+        return array != nullptr ? *array : nullptr;
+    }
+    /// Null when this is no dictionary.
+    DictionaryRef dictionary() const {
+        const auto* dictionary = std::get_if<DictionaryRef>(&_value);
+        return dictionary != nullptr ? *dictionary : nullptr;
+    }
+
+    /// Becomes what is given; where it was of that kind before, at the cost of a plain copy.
+    void assign(const DisplayNumber& number) { _value = number; }
+    void assign(Text text) { _value = std::move(text); }
 
     /// The number as a signed 32-bit integer: an integer in range, or a real with a whole value
     /// in range; nothing otherwise. A string is no number, whatever it reads.
@@ -123,11 +137,14 @@ private:
 class Dictionary {
 public:
     struct Entry {
+        Entry(Text entryKey, PropertyList entryValue, bool isStringKey = true)
+            : key(std::move(entryKey)), value(std::move(entryValue)), hasStringKey(isStringKey) {}
+
         Text key;
         PropertyList value;
         /// False for an entry whose key was no string in the source (`key` is its printed form):
         /// only a walk over the entries meets it.
-        bool hasStringKey = true;
+        bool hasStringKey;
     };
 
     Dictionary() = default;
@@ -145,12 +162,21 @@ public:
     /// Replaces the value under `key` where it stands, or appends.
     void set(Text key, PropertyList value);
     /// The same for a key with static storage duration; allocates no key.
-    void setFixed(std::string_view key, PropertyList value);
+    void setFixed(std::string_view key, PropertyList value) { valueToSet(key) = std::move(value); }
+    /// The value under such a key, appended as null where it is not there yet. Valid until the
+    /// next change.
+    PropertyList& valueToSet(std::string_view key) {
+        return _next < _entries.size() && isAt(_next, key) ? _entries[_next++].value
+                                                           : searchedOrAppended(key);
+    }
     void appendForeignKey(const PropertyList& key, PropertyList value);
     /// True when there was something to remove.
     bool remove(std::string_view key);
 
     void reserve(std::size_t count) { _entries.reserve(count); }
+    /// Removes all entries but the first `count` and keeps their memory. The next one to be set is
+    /// looked for from the first on.
+    void truncate(std::size_t count);
     std::size_t size() const { return _entries.size(); }
     bool empty() const { return _entries.empty(); }
     auto begin() const { return _entries.begin(); }
@@ -158,13 +184,27 @@ public:
 
 private:
     static constexpr std::size_t kNotFound = static_cast<std::size_t>(-1);
+    /// The views point into the entries' keys.
+    using Index = std::unordered_map<std::string_view, std::size_t>;
+
+    /// A key from a table is mostly the very text that was set before, and need not be compared.
+    bool isAt(std::size_t at, std::string_view key) const {
+        const Entry& entry = _entries[at];
+        const std::string_view there = entry.key.view();
+        return there.size() == key.size() && (there.data() == key.data() || there == key) &&
+               entry.hasStringKey;
+    }
     std::size_t indexOf(std::string_view key) const;
-    void append(Entry entry);
+    PropertyList& searchedOrAppended(std::string_view key);
+    void append(Text key, PropertyList value, bool isStringKey);
     void rebuildIndex();
 
     std::vector<Entry> _entries;
-    /// Kept once a linear search would be slow; the views point into the entries' keys.
-    std::unordered_map<std::string_view, std::size_t> _index;
+    /// Kept once a linear search would be slow; null before.
+    std::unique_ptr<Index> _index;
+    /// Behind the entry that was set last. Whoever sets many keys sets them in their order, so
+    /// that the next one is mostly found here, without a search.
+    std::size_t _next = 0;
 };
 
 /// The same order of keys and the same values; what tests of "in this order" compare.

@@ -26,6 +26,10 @@ public:
 
     std::string_view view() const { return _view; }
     std::string string() const { return std::string(_view); }
+    /// The text as a string that outlives this: the owned one itself, or a copy of a fixed text.
+    std::shared_ptr<const std::string> sharedString() const {
+        return _owner ? _owner : std::make_shared<const std::string>(_view);
+    }
 
     friend bool operator==(const Text& a, const Text& b) { return a._view == b._view; }
 

@@ -16,11 +16,20 @@ constexpr std::string_view kUtf16BigEndianMark = "\xFE\xFF";
 constexpr std::string_view kUtf16LittleEndianMark = "\xFF\xFE";
 constexpr auto kEntities = std::to_array<std::string_view>({"amp", "lt", "gt", "quot", "apos"});
 
+/// A printable ASCII character or a new line or tabulator.
+constexpr bool isPlain(char letter) {
+    return (letter >= ' ' && letter <= '~') || letter == '\n' || letter == '\t';
+}
+
 void checkCharacters(std::string_view xml) {
     if (xml.starts_with(kUtf16BigEndianMark) || xml.starts_with(kUtf16LittleEndianMark)) {
         refuse(0, "UTF-16, where only UTF-8 is read");
     }
     for (std::size_t at = 0; at < xml.size();) {
+        if (isPlain(xml[at])) { // almost every one; half of the check's time was utf8At's
+            ++at;
+            continue;
+        }
         const Utf8CodePoint next = utf8At(xml, at);
         if (next.size == 0) {
             refuse(at, "a byte that is no UTF-8");
@@ -107,6 +116,15 @@ std::size_t skipDocumentType(std::string_view xml, std::size_t at) {
     return std::min(at + 1, xml.size());
 }
 
+/// Where the next tag or reference begins from `at` on, or the end. (The library's search for one
+/// of two letters calls a function for each letter that it passes.)
+std::size_t nextMarkup(std::string_view xml, std::size_t at) {
+    while (at < xml.size() && xml[at] != '<' && xml[at] != '&') {
+        ++at;
+    }
+    return at;
+}
+
 /// Checks the attribute values of a tag.
 std::size_t checkTag(std::string_view xml, std::size_t at) {
     char quote = 0;
@@ -148,8 +166,7 @@ std::size_t checkMarkup(std::string_view xml, std::size_t at) {
 
 void checkXmlMarkup(std::string_view xml) {
     checkCharacters(xml);
-    for (std::size_t at = xml.find_first_of("<&"); at < xml.size();
-         at = xml.find_first_of("<&", at)) {
+    for (std::size_t at = nextMarkup(xml, 0); at < xml.size(); at = nextMarkup(xml, at)) {
         at = xml[at] == '&' ? checkReference(xml, at) : checkMarkup(xml, at);
     }
 }

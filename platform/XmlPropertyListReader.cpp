@@ -1,4 +1,5 @@
 #include "platform/Base64.h"
+#include "platform/PlainXmlReader.h"
 #include "platform/PropertyListCodec.h"
 #include "platform/Refusal.h"
 #include "platform/XmlMarkupCheck.h"
@@ -15,18 +16,23 @@ namespace pallax {
 namespace {
 
 constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
-constexpr std::string_view kSpaces = " \t\r\n";
 
 // White space belongs to strings; what stands beside the root element must be seen to be refused.
 constexpr unsigned kParsing = pugi::parse_cdata | pugi::parse_escapes | pugi::parse_eol |
                               pugi::parse_ws_pcdata | pugi::parse_fragment;
 
+constexpr bool isSpace(char letter) {
+    return letter == ' ' || letter == '\t' || letter == '\r' || letter == '\n';
+}
+
 std::string_view trimmed(std::string_view text) {
-    const std::size_t first = text.find_first_not_of(kSpaces);
-    if (first == std::string_view::npos) {
-        return {};
+    while (!text.empty() && isSpace(text.front())) {
+        text.remove_prefix(1);
     }
-    return text.substr(first, text.find_last_not_of(kSpaces) - first + 1);
+    while (!text.empty() && isSpace(text.back())) {
+        text.remove_suffix(1);
+    }
+    return text;
 }
 
 bool isDigit(char letter) {
@@ -263,6 +269,9 @@ PropertyList XmlReader::dictionary(pugi::xml_node element, std::size_t depth) co
 PropertyList readXml(Bytes bytes) {
     requireReadableSize(bytes);
     std::string text(bytes.begin(), bytes.end());
+    if (auto plain = readPlainXml(text)) {
+        return *std::move(plain);
+    }
     checkXmlMarkup(text);
     const std::size_t start = text.starts_with(kUtf8Mark) ? kUtf8Mark.size() : 0;
     pugi::xml_document document;

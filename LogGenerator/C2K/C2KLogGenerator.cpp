@@ -109,7 +109,8 @@ PropertyList C2KLogGenerator::getDisplayFromState(Dictionary& state) const {
 void C2KLogGenerator::updateState(Dictionary& state, Bytes data) {
     (void)getDisplayFromState(state);
     const DictionaryRef lookup = dictionaryUnder("Lookup", state);
-    updateFromLog(data, lookup != nullptr ? *lookup : Dictionary(), state);
+    const Dictionary nowhere;
+    updateFromLog(data, lookup != nullptr ? *lookup : nowhere, state); // neither is copied
 }
 
 void C2KLogGenerator::updateFromLog(Bytes packet, const Dictionary& lookup, Dictionary& state) {

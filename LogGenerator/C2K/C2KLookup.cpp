@@ -39,11 +39,11 @@ void setLookupValue(std::string_view lookupName, const PropertyList& value,
         const PropertyList* key = place != nullptr ? place->find(kKey) : nullptr;
         const PropertyList* dict = place != nullptr ? place->find(kDict) : nullptr;
         const DictionaryRef display = dict != nullptr ? dict->dictionary() : nullptr;
-        auto name = key != nullptr ? key->string() : std::nullopt;
-        if (display == nullptr || !name) {
+        const Text* name = key != nullptr ? key->text() : nullptr;
+        if (display == nullptr || name == nullptr) {
             return;
         }
-        display->set(*std::move(name), value);
+        display->set(*name, value);
     }
 }
 

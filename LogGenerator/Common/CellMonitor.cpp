@@ -1,7 +1,6 @@
 #include "LogGenerator/Common/CellMonitor.h"
 
 #include "LogGenerator/Records/Formats.h"
-#include "platform/PropertyListCodec.h"
 #include "platform/SystemLog.h"
 #include "platform/TelephonyConstants.h"
 
@@ -19,7 +18,7 @@ bool holds(const Dictionary& cell, std::string_view key, std::string_view value)
 } // namespace
 
 std::optional<Array> readCellMonitorArray(const LogRecord& record) {
-    const PropertyListResult parsed = parsePropertyList(record.payload());
+    const PropertyListResult parsed = record.payloadAsPropertyList();
     if (!parsed) {
         systemLog(LogPriority::Error, "Cell Info Array data could not be constructed");
         return std::nullopt;

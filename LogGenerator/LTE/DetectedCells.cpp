@@ -41,9 +41,9 @@ void DetectedCells::updateWithData(const LogRecord& record, LogCode logCode) {
     clearList();
     const EntryList cells(record, layoutOf(record), record.u8(kDetectedCountOffset));
     if (cells.count() != 0) {
-        replaceList(cells.map([](const LogRecord& entry, std::size_t /*index*/) {
-            return entryOf(kCellFields, entry);
-        }));
+        replaceList(cells, [](Dictionary& target, const LogRecord& entry) {
+            fillEntry(target, kCellFields, entry);
+        });
     }
 }
 

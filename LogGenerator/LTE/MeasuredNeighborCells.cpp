@@ -52,9 +52,9 @@ void MeasuredNeighborCells::updateWithData(const LogRecord& record, LogCode logC
     clearList();
     if (sizeIsExpected(record)) {
         const EntryList neighbours(record, kNeighbours, record.u8(kMeasuredCountOffset));
-        replaceList(neighbours.map([](const LogRecord& entry, std::size_t /*index*/) {
-            return entryOf(kNeighbourFields, entry);
-        }));
+        replaceList(neighbours, [](Dictionary& target, const LogRecord& entry) {
+            fillEntry(target, kNeighbourFields, entry);
+        });
     }
 }
 

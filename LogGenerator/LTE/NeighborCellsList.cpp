@@ -40,6 +40,9 @@ static_assert(kCellFields.size() == 12);
 
 /// One line for the cell, and one for each of its levels: the values that are no whole numbers.
 void trace(const Dictionary& cell, std::int64_t physicalCellId) {
+    if (!SystemLog::isEnabled(LogPriority::Warning)) {
+        return;
+    }
     systemLog(LogPriority::Warning, "Physical Cell ID: %d\n", physicalCellId);
     for (const Dictionary::Entry& entry : cell) {
         const DisplayNumber* number = entry.value.displayNumber();
@@ -49,10 +52,9 @@ void trace(const Dictionary& cell, std::int64_t physicalCellId) {
     }
 }
 
-PropertyList cellOf(const LogRecord& entry) {
-    Dictionary cell = entryOf(kCellFields, entry);
+void fillCell(Dictionary& cell, const LogRecord& entry) {
+    fillEntry(cell, kCellFields, entry);
     trace(cell, entry.read(kPhysicalCellId));
-    return cell;
 }
 
 } // namespace
@@ -73,8 +75,7 @@ void NeighborCellsList::updateWithData(const LogRecord& record, LogCode logCode)
     const auto count = static_cast<std::size_t>(record.read(kCountLessOne)) + 1;
     systemLog(LogPriority::Warning, "Number of neighboring cells being reported: %d\n", count);
     const EntryList cells(record, kCells, count);
-    replaceList(
-        cells.map([](const LogRecord& entry, std::size_t /*index*/) { return cellOf(entry); }));
+    replaceList(cells, fillCell);
 }
 
 } // namespace pallax

@@ -82,7 +82,10 @@ void Base::removeKey(std::string_view key) {
 
 void Base::clearList() {
     if (const ArrayRef list = _sectionRef.array()) {
-        clearElementsInArray(*list);
+        _spares.clear();
+        ArrayLock::lockArray();
+        _spares.swap(*list);
+        ArrayLock::unlockArray();
     }
 }
 
@@ -90,6 +93,19 @@ void Base::replaceList(Array with) {
     if (const ArrayRef list = _sectionRef.array()) {
         replaceArray(*list, std::move(with));
     }
+}
+
+DictionaryRef Base::spareEntry() {
+    while (!_spares.empty()) {
+        const PropertyList spare = std::move(_spares.back());
+        _spares.pop_back();
+        DictionaryRef entry = spare.dictionary();
+        constexpr long kSpareAndEntry = 2;
+        if (entry != nullptr && entry.use_count() == kSpareAndEntry) {
+            return entry;
+        }
+    }
+    return std::make_shared<Dictionary>();
 }
 
 void Base::logUnknown(LogCode logCode) {

@@ -55,6 +55,8 @@ public:
     }
 
     PropertyList valueOf(std::int64_t raw) const;
+    /// The same in place of what `value` was before.
+    void showIn(PropertyList& value, std::int64_t raw) const;
 
     constexpr bool isNumber() const { return _format != nullptr; }
 
@@ -83,5 +85,8 @@ void showFields(Dictionary& target, std::span<const Field> fields, const LogReco
 
 /// A dictionary of the fields: one entry of a list.
 Dictionary entryOf(std::span<const Field> fields, const LogRecord& record);
+
+/// The same in place of what `entry` held before, mostly values under the same keys.
+void fillEntry(Dictionary& entry, std::span<const Field> fields, const LogRecord& record);
 
 } // namespace pallax

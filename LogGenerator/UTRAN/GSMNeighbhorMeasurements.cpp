@@ -43,8 +43,7 @@ void GSMNeighbhorMeasurements::updateWithData(const LogRecord& record, LogCode l
     if (logCode != kNeighboursLogCode || !record.has(kMinimumLength)) {
         return;
     }
-    clearList();
-    (void)cellsOf(record); // read whole, but not for the display
+    clearList(); // the cells are for whoever asks for them, not for the display
 }
 
 } // namespace pallax

@@ -5,7 +5,7 @@
 namespace pallax {
 
 /// The GSM neighbour cells, section "GSM Neighbor Cell List", which never shows them: a record
-/// empties the section, and the cells that it tells are read and dropped.
+/// empties the section, and the cells that it tells are not shown.
 ///
 ///   0xD00E, at least 17 bytes, little-endian
 ///   byte     bit  width   field

@@ -24,8 +24,9 @@ void TRCHBLERMeasurement::updateWithData(const LogRecord& record, LogCode logCod
         return;
     }
     clearList();
-    replaceList(transportChannels(record).map(
-        [](const LogRecord& entry, std::size_t /*index*/) { return entryOf(kFields, entry); }));
+    replaceList(transportChannels(record), [](Dictionary& target, const LogRecord& entry) {
+        fillEntry(target, kFields, entry);
+    });
 }
 
 } // namespace pallax

@@ -19,30 +19,29 @@ constexpr EntryList::Layout kCells{.start = 168, .stride = 16, .bytesRead = 4};
 constexpr NumberFormat kSixDecimals{"%f"};
 constexpr double kRscpStep = 1.0 / 256;
 
-constexpr auto kFields = std::to_array<Field>({
-    {"UARFCN", bitsAt(0, 0, 14), Conversion::number()},
-    {"Cell ID", bitsAt(1, 6, 7), Conversion::number()},
-    {"Filter RSCP", bitsAt(2, 5, 8), Conversion::number(kSixDecimals, kRscpStep)},
-});
-
 constexpr Position kStatus = bitsAt(3, 5, 2);
 constexpr auto kStatuses = std::to_array<std::string_view>({"ASET", "MSET", "DSET"});
 static_assert(kStatuses.size() == 3);
-constexpr auto kStatusField =
-    std::to_array<Field>({{"Status", kStatus, Conversion::label(kStatuses)}});
 
-constexpr auto kDetectionField =
-    std::to_array<Field>({{"inJDCS", bitsAt(3, 7, 1), Conversion::flag("TRUE", "FALSE")}});
+constexpr Field kUarfcn{"UARFCN", bitsAt(0, 0, 14), Conversion::number()};
+constexpr Field kCellId{"Cell ID", bitsAt(1, 6, 7), Conversion::number()};
+constexpr Field kFilterRscp{"Filter RSCP", bitsAt(2, 5, 8),
+                            Conversion::number(kSixDecimals, kRscpStep)};
+constexpr Field kStatusField{"Status", kStatus, Conversion::label(kStatuses)};
+constexpr Field kDetection{"inJDCS", bitsAt(3, 7, 1), Conversion::flag("TRUE", "FALSE")};
 
-PropertyList cellOf(const LogRecord& entry) {
-    Dictionary cell;
-    cell.reserve(kFields.size() + kStatusField.size() + kDetectionField.size());
-    showFields(cell, kFields, entry);
+constexpr auto kFields =
+    std::to_array<Field>({kUarfcn, kCellId, kFilterRscp, kStatusField, kDetection});
+/// Of a cell whose status is none of the three.
+constexpr auto kFieldsWithoutStatus =
+    std::to_array<Field>({kUarfcn, kCellId, kFilterRscp, kDetection});
+
+void fillCell(Dictionary& cell, const LogRecord& entry) {
     if (entry.read(kStatus) < std::int64_t{kStatuses.size()}) {
-        showFields(cell, kStatusField, entry);
+        fillEntry(cell, kFields, entry);
+    } else {
+        fillEntry(cell, kFieldsWithoutStatus, entry);
     }
-    showFields(cell, kDetectionField, entry);
-    return cell;
 }
 
 } // namespace
@@ -58,7 +57,7 @@ void UTRANNeighbhorMeasurements::updateWithData(const LogRecord& record, LogCode
     }
     clearList();
     const EntryList cells(record, kCells, static_cast<std::size_t>(record.read(kCellCount)));
-    replaceList(cells.map([](const LogRecord& entry, std::size_t) { return cellOf(entry); }));
+    replaceList(cells, fillCell);
 }
 
 } // namespace pallax

@@ -40,9 +40,9 @@ void GSMSet::updateWithData(const LogRecord& record, LogCode logCode) {
     const EntryList entries(record, {kRankingEntriesStart, kEntryLength, kEntryLength},
                             record.u8(kCountOffset));
     if (entries.count() != 0) {
-        replaceList(entries.map([](const LogRecord& entry, std::size_t /*index*/) {
-            return entryOf(kEntryFields, entry);
-        }));
+        replaceList(entries, [](Dictionary& target, const LogRecord& entry) {
+            fillEntry(target, kEntryFields, entry);
+        });
     }
 }
 

@@ -74,18 +74,18 @@ void NeighboringCells::showMeasuredCells(const LogRecord& record) {
     clearList();
     const EntryList neighbours(record, kNeighbours, record.u8(kNeighbourCountOffset));
     if (neighbours.count() != 0) {
-        replaceList(neighbours.map(
-            [this](const LogRecord& entry, std::size_t) { return measuredCell(entry); }));
+        replaceList(neighbours, [this](Dictionary& cell, const LogRecord& entry) {
+            fillMeasuredCell(cell, entry);
+        });
     }
 }
 
-PropertyList NeighboringCells::measuredCell(const LogRecord& entry) const {
-    Dictionary cell = entryOf(kNeighbourFields, entry);
+void NeighboringCells::fillMeasuredCell(Dictionary& cell, const LogRecord& entry) const {
+    fillEntry(cell, kNeighbourFields, entry);
     const auto bsic = arfcnToBsic.find(entry.u16(kArfcnInEntry));
     if (bsic != arfcnToBsic.end()) {
         cell.setFixed("BSIC", DisplayNumber(std::int64_t{bsic->second}, kDecimal));
     }
-    return cell;
 }
 
 void NeighboringCells::rememberBsics(const LogRecord& record) {

@@ -47,7 +47,7 @@ private:
     void showMeasuredCells(const LogRecord& record);
     void rememberBsics(const LogRecord& record);
     void showMonitoredCells(const LogRecord& record);
-    PropertyList measuredCell(const LogRecord& entry) const;
+    void fillMeasuredCell(Dictionary& cell, const LogRecord& entry) const;
 
     std::unordered_map<std::uint16_t, std::uint8_t> arfcnToBsic;
 };

@@ -69,9 +69,9 @@ void UMTSSet::updateFromRanking(const LogRecord& record) {
     const EntryList entries(record, {kRankingEntriesStart, kEntryLength, kEntryLength},
                             record.u8(kCountOffset));
     if (entries.count() != 0) {
-        replaceList(entries.map([](const LogRecord& entry, std::size_t /*index*/) {
-            return entryOf(kEntryFields, entry);
-        }));
+        replaceList(entries, [](Dictionary& target, const LogRecord& entry) {
+            fillEntry(target, kEntryFields, entry);
+        });
     }
 }
 

@@ -22,12 +22,17 @@ std::string_view nameOfSortedKey(std::string_view key) {
 
 } // namespace
 
+std::shared_ptr<const std::string> ShownEntry::sharedName() const {
+    return name.size() == key->view().size() ? key->sharedString()
+                                             : std::make_shared<const std::string>(name);
+}
+
 std::vector<ShownEntry> shownEntries(const Dictionary& dictionary) {
     std::vector<ShownEntry> shown;
     shown.reserve(dictionary.size());
     for (const Dictionary::Entry& entry : dictionary) {
         if (entry.hasStringKey && entry.key.view() != kSortedKey && !entry.value.isNull()) {
-            shown.push_back({entry.key.view(), &entry.value});
+            shown.push_back({entry.key.view(), &entry.key, &entry.value});
         }
     }
     const PropertyList* mark = dictionary.find(kSortedKey);

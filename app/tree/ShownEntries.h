@@ -2,16 +2,22 @@
 
 #include "platform/PropertyList.h"
 
+#include <memory>
+#include <string>
 #include <string_view>
 #include <vector>
 
 namespace pallax {
 
-/// An entry of a display dictionary as a row: its name and its value. Both belong to the
-/// dictionary and are valid until its next change.
+/// An entry of a display dictionary as a row: its name, its key and its value. They belong to
+/// the dictionary and are valid until its next change.
 struct ShownEntry {
     std::string_view name;
+    const Text* key;
     const PropertyList* value;
+
+    /// The name as a string that outlives the dictionary; the key's own where it can be.
+    std::shared_ptr<const std::string> sharedName() const;
 };
 
 /// The rows of a display dictionary, in display order: every entry with a string key and a value
