@@ -1,13 +1,38 @@
+// Property lists in XML: any text is read or refused, what is read can be written and read again,
+// and what the quick reader of plain texts takes, the whole reader reads alike.
+
 #include "fuzz/PropertyListCheck.h"
+#include "platform/PlainXmlReader.h"
 #include "platform/PropertyListCodec.h"
 
 #include <cstddef>
 #include <cstdint>
+#include <cstdlib>
+#include <string>
+
+namespace {
+
+using namespace pallax;
+
+void requireTheSameByTheWholeReader(const PropertyList& plain, std::string text) {
+    text += "<!-- a comment, which is not plain -->";
+    const ByteBuffer bytes(text.begin(), text.end());
+    const auto whole = parseXmlPropertyList(bytes);
+    if (!whole || !(*whole == plain)) {
+        std::abort();
+    }
+}
+
+} // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-    const auto result = pallax::parseXmlPropertyList({data, size});
+    const std::string text(data, data + size);
+    if (const auto plain = readPlainXml(text)) {
+        requireTheSameByTheWholeReader(*plain, text);
+    }
+    const auto result = parseXmlPropertyList({data, size});
     if (result) {
-        pallax::requireSameAfterWriting(*result);
+        requireSameAfterWriting(*result);
     }
     return 0;
 }
