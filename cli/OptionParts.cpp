@@ -14,7 +14,8 @@ CLI::ValidationError unknownChoice(const std::string& name, const std::string& t
     for (std::string each; std::getline(rest, each, '|');) {
         known.push_back(each);
     }
-    return {name, "\"" + text + "\" is none of " + names + suggestion(text, known)};
+    return CLI::ValidationError(name,
+                                "\"" + text + "\" is none of " + names + suggestion(text, known));
 }
 
 CLI::Option* addSpeed(CLI::App& app, PlayOptions& play) {
