@@ -181,6 +181,15 @@ std::string seeAlso(const CommandDescription& program, const CommandDescription*
     return list + ".BR pallax.conf (5),\n.BR pallax\\-recording (7)\n";
 }
 
+/// "Pallax shows that." as "shows that", for it stands behind the name.
+std::string_view titleOf(std::string_view description) {
+    constexpr std::string_view kSubject = "Pallax ";
+    if (description.starts_with(kSubject)) {
+        description.remove_prefix(kSubject.size());
+    }
+    return description.substr(0, description.find_last_not_of('.') + 1);
+}
+
 std::string upperCase(std::string text) {
     for (char& character : text) {
         character = character >= 'a' && character <= 'z' ? static_cast<char>(character - 'a' + 'A')
@@ -196,9 +205,7 @@ std::string page(const CommandDescription& program, const CommandDescription* co
     std::string text = ".\\\" Written by \"pallax manual " + name + "\".\n";
     text += ".TH " + escaped(upperCase(name)) +
             " 1 " PALLAX_DATE " \"pallax " PALLAX_VERSION "\" Pallax\n";
-    std::string title =
-        subject.description.substr(0, subject.description.find_last_not_of('.') + 1);
-    text += ".SH NAME\n" + escaped(name) + " \\- " + escaped(title) + "\n";
+    text += ".SH NAME\n" + escaped(name) + " \\- " + escaped(titleOf(subject.description)) + "\n";
     text += synopsis(program, command);
     text += ".SH DESCRIPTION\n" + sentence(subject.description) + footer.notes;
     text += listOf("ARGUMENTS", subject.arguments);

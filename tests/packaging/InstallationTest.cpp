@@ -101,7 +101,8 @@ TEST_F(Installation, TheTypeOfRecordingsIsTakenByTheDatabase) {
     if (!isInstalled("update-mime-database")) {
         GTEST_SKIP() << "update-mime-database is not installed";
     }
-    const auto run = runCommand("update-mime-database " + prefix.path("share/mime"));
+    const auto run = runCommand("XDG_DATA_DIRS=" + prefix.path("share") + " update-mime-database " +
+                                prefix.path("share/mime"));
     EXPECT_EQ(run.status, 0) << run.out;
     EXPECT_EQ(run.out, "");
     EXPECT_NE(contentOf(prefix.path("share/mime/globs2"))
