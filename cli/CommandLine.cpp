@@ -100,7 +100,8 @@ CommandDescription CommandLine::description() const {
 
 std::string CommandLine::mistypedCommand(const std::string& first) const {
     std::error_code ignored;
-    if (first.starts_with('-') || std::filesystem::exists(first, ignored)) {
+    const bool path = first.find('/') != std::string::npos;
+    if (path || first.starts_with('-') || std::filesystem::exists(first, ignored)) {
         return "";
     }
     std::vector<std::string> names;
