@@ -60,7 +60,7 @@ std::string casesOf(const CommandDescription& command, const std::string& name) 
         for (const std::string& each : option.names) {
             options.push_back(each);
             if (!option.value.empty()) {
-                values.append("        '" + name + " " + each + "')");
+                values.append("        '").append(name).append(" ").append(each).append("')");
                 values.append(offerOf(option)).append(" ;;\n");
             }
         }
