@@ -34,11 +34,11 @@ std::string valueOf(const OptionDescription& option) {
     return ":" + quoted(message, ":\\") + ":" + action;
 }
 
-std::string line(const std::string& specification) {
-    return " \\\n        '" + specification + "'";
+std::string line(const std::string& entry) {
+    return " \\\n        '" + entry + "'";
 }
 
-std::string specificationsOf(const CommandDescription& command) {
+std::string linesOf(const CommandDescription& command) {
     std::string lines;
     for (const OptionDescription& option : command.options) {
         std::string exclusive;
@@ -47,9 +47,12 @@ std::string specificationsOf(const CommandDescription& command) {
         }
         for (const std::string& name : option.names) {
             const bool valueMayJoin = !option.value.empty() && name.starts_with("--");
-            lines.append(line("(" + exclusive + ")" + name + (valueMayJoin ? "=" : "") + "[" +
-                              quoted(option.description, "[]\\") + "]" +
-                              (option.value.empty() ? "" : valueOf(option))));
+            std::string entry = "(";
+            entry.append(exclusive).append(")").append(name);
+            entry.append(valueMayJoin ? "=[" : "[");
+            entry.append(quoted(option.description, "[]\\")).append("]");
+            entry.append(option.value.empty() ? "" : valueOf(option));
+            lines.append(line(entry));
         }
     }
     return lines;
@@ -60,8 +63,8 @@ std::string functionOf(const CommandDescription& command) {
     for (const OptionDescription& argument : command.arguments) {
         arguments.append(line((argument.repeats ? "*" : "") + valueOf(argument)));
     }
-    return "_pallax_" + command.name + "() {\n    _arguments -s" + specificationsOf(command) +
-           arguments + "\n}\n\n";
+    return "_pallax_" + command.name + "() {\n    _arguments -s" + linesOf(command) + arguments +
+           "\n}\n\n";
 }
 
 } // namespace
@@ -87,7 +90,7 @@ std::string zshCompletion(const CommandDescription& program) {
                   ") ]]; then\n");
     script.append("        local command=$words[2]\n        shift words\n        (( CURRENT-- ))\n"
                   "        _pallax_$command\n        return\n    fi\n    _arguments -s");
-    script.append(specificationsOf(program));
+    script.append(linesOf(program));
     script.append(line(":command or recording:_pallax_commands_or_files"));
     script.append("\n}\n\nif [[ $funcstack[1] == _pallax ]]; then\n    _pallax \"$@\"\n"
                   "else\n    compdef _pallax pallax\nfi\n");
