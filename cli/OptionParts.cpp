@@ -1,8 +1,22 @@
 #include "cli/OptionParts.h"
 
+#include "cli/Suggestion.h"
 #include "telephony/Service.h"
 
+#include <sstream>
+
 namespace pallax {
+
+CLI::ValidationError unknownChoice(const std::string& name, const std::string& text,
+                                   const std::string& names) {
+    std::vector<std::string> known;
+    std::istringstream rest(names);
+    for (std::string each; std::getline(rest, each, '|');) {
+        known.push_back(each);
+    }
+    return CLI::ValidationError(name,
+                                "\"" + text + "\" is none of " + names + suggestion(text, known));
+}
 
 CLI::Option* addSpeed(CLI::App& app, PlayOptions& play) {
     const auto takeSpeed = [&play](const std::string& text) {

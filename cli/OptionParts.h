@@ -14,6 +14,10 @@
 /// What several commands' options are made of.
 namespace pallax {
 
+/// "NAME: "TEXT" is none of NAMES", which are separated by |; the nearest of them is proposed.
+CLI::ValidationError unknownChoice(const std::string& name, const std::string& text,
+                                   const std::string& names);
+
 /// Every choice goes by its name in the map, in the help and in the message about a wrong one.
 template <class Value>
 CLI::Option* addChoice(CLI::App& app, const std::string& name, Value& value,
@@ -27,7 +31,7 @@ CLI::Option* addChoice(CLI::App& app, const std::string& name, Value& value,
         const auto found = std::find_if(choices.begin(), choices.end(),
                                         [&](const auto& choice) { return choice.first == text; });
         if (found == choices.end()) {
-            throw CLI::ValidationError(name, "\"" + text + "\" is none of " + names);
+            throw unknownChoice(name, text, names);
         }
         value = found->second;
     };

@@ -1,5 +1,6 @@
 #include "cli/Options.h"
 
+#include "cli/CommandLine.h"
 #include "cli/OptionParts.h"
 
 #include <CLI/CLI.hpp>
@@ -10,8 +11,6 @@
 namespace pallax {
 
 namespace {
-
-constexpr const char* kVersionText = "pallax " PALLAX_VERSION;
 
 constexpr const char* kFooter = R"(Examples:
   pallax                               browse the live modem
@@ -43,18 +42,6 @@ constexpr const char* kRecordFooter = R"(Examples:
 With --rotate-size or --rotate-seconds the files are drive-0001.pcapng, drive-0002.pcapng, ...
 Recording ends with Ctrl-C, and with the source. A viewer may run at the same time.)";
 
-constexpr const char* kServiceFooter = R"(Examples:
-  pallax service --play drive.pcap
-  pallax service --play drive.pcap --speed max --loop
-  pallax service --simulate lte --seed 7
-  pallax service --simulate ifx --seconds 600 --speed max
-  ssh phone modem-dump | pallax service --relay -
-  pallax service --status
-
-Every client gets a channel of its own. A recording or simulation begins anew for each; what is
-relayed goes to all as it comes, and the service ends with it. A client that is too slow loses packets and
-delays nobody; with --speed max it sets its own pace and loses nothing.)";
-
 void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
     addSpeed(app, play)->needs(recording);
     app.add_flag("--loop", play.loop, "Begin again at the recording's end")->needs(recording);
@@ -68,7 +55,8 @@ void addLogLevel(CLI::App& app, std::optional<int>& level) {
         ->type_name("0-7");
 }
 
-/// What is common to all ways of browsing.
+} // namespace
+
 void addView(CLI::App& app, BrowseOptions& options) {
     app.add_flag("--print", options.print,
                  "Print the tree as text at each display tick, as is done without a terminal");
@@ -86,6 +74,8 @@ void addView(CLI::App& app, BrowseOptions& options) {
     addLogLevel(app, options.logLevel);
 }
 
+namespace {
+
 void addTechnology(CLI::App& app, const RecordedTechnology*& technology,
                    const std::string& description) {
     std::vector<std::pair<std::string, const RecordedTechnology*>> technologies;
@@ -94,6 +84,8 @@ void addTechnology(CLI::App& app, const RecordedTechnology*& technology,
     }
     addChoice(app, "--technology", technology, technologies, description);
 }
+
+} // namespace
 
 void addBrowse(CLI::App& app, BrowseOptions& options) {
     CLI::Option* recording =
@@ -104,6 +96,7 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
             ->type_name("");
     addView(app, options);
     addPlay(app, options.play, recording);
+    app.footer(kFooter);
 }
 
 void addDecode(CLI::App& app, DecodeOptions& options) {
@@ -174,171 +167,8 @@ ParseEnd wrongUsage(std::string reason) {
     return {kExitWrongUsage, "pallax: " + reason + " (pallax --help tells more)\n"};
 }
 
-/// What the service is to do, one of them.
-struct ServiceRequest {
-    ServiceOptions options;
-    std::string relayed; ///< a stream; empty where none is asked for
-    bool status = false;
-};
-
-void addServicePlay(CLI::App& app, ServiceOptions& options) {
-    CLI::Option* recording =
-        app.add_option("--play", options.recording, "The recording to play to each client")
-            ->type_name("RECORDING");
-    addSpeed(app, options.play);
-    app.add_flag("--loop", options.play.loop, "Begin again at the recording's end")
-        ->needs(recording);
-}
-
-void addServiceSimulated(CLI::App& app, std::optional<SimulationOptions>& simulation) {
-    addServiceSimulation(app, simulation)->excludes("--play");
-}
-
-void addServiceRelay(CLI::App& app, std::string& relayed) {
-    const auto take = [&relayed](const std::string& text) {
-        if (text != "-") {
-            throw CLI::ValidationError("--relay", "only -, standard input, can be relayed");
-        }
-        relayed = text;
-    };
-    app.add_option_function<std::string>(
-           "--relay", take, "Pass on the live pcap stream of standard input (-) to every client")
-        ->type_name("-")
-        ->excludes("--play")
-        ->excludes("--speed") // the stream has its own
-        ->excludes("--simulate");
-}
-
-void addServiceStatus(CLI::App& app, bool& status) {
-    app.add_flag("--status", status, "Print what the running service serves, and end")
-        ->excludes("--play")
-        ->excludes("--speed")
-        ->excludes("--simulate")
-        ->excludes("--relay");
-}
-
-void addService(CLI::App& app, ServiceRequest& request) {
-    addServicePlay(app, request.options);
-    addServiceSimulated(app, request.options.simulation);
-    addServiceRelay(app, request.relayed);
-    addServiceStatus(app, request.status);
-    app.footer(kServiceFooter);
-}
-
-ParsedOptions serviceOptions(const ServiceRequest& request) {
-    if (request.status) {
-        return ServiceStatusOptions();
-    }
-    ServiceOptions options = request.options;
-    if (!request.relayed.empty()) {
-        options.recording = request.relayed;
-        options.relay = true;
-    }
-    if (options.recording.empty() && !options.simulation) {
-        return wrongUsage("the service needs --play, --simulate, --relay or --status");
-    }
-    return options;
-}
-
-ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
-    if (dynamic_cast<const CLI::CallForVersion*>(&error) != nullptr) {
-        return {kExitSuccess, std::string(kVersionText) + "\n"};
-    }
-    if (error.get_exit_code() == static_cast<int>(CLI::ExitCodes::Success)) {
-        return {kExitSuccess, app.help()};
-    }
-    return wrongUsage(error.what());
-}
-
-bool loopsStandardInput(std::string_view recording, const PlayOptions& play) {
-    return play.loop && recording == "-";
-}
-
-/// Help pages without the library's marks for what an option demands.
-class PlainFormatter final : public CLI::Formatter {
-public:
-    std::string make_option_opts(const CLI::Option* option) const override {
-        const std::string type = option->get_type_name();
-        return type.empty() ? "" : " " + type;
-    }
-};
-
-/// The help and version flags that every command has.
-void prepare(CLI::App& app) {
-    app.formatter(std::make_shared<PlainFormatter>());
-    app.set_help_flag("-h,--help", "Show this help and exit");
-    app.set_version_flag("--version", kVersionText, "Show the version and exit");
-}
-
-} // namespace
-
 ParsedOptions parseOptions(std::vector<std::string> arguments) {
-    CLI::App app("Pallax shows what a phone's cellular radio is doing.", "pallax");
-    BrowseOptions browse;
-    DecodeOptions decode;
-    RecordOptions record;
-    ServiceRequest service;
-    prepare(app);
-    addBrowse(app, browse);
-    app.footer(kFooter);
-    CLI::App* decodeApp = app.add_subcommand("decode", "Recordings to JSON or CSV");
-    prepare(*decodeApp);
-    addDecode(*decodeApp, decode);
-    CLI::App* recordApp = app.add_subcommand("record", "Write the live channel to a recording");
-    prepare(*recordApp);
-    addRecord(*recordApp, record);
-    CLI::App* serviceApp =
-        app.add_subcommand("service", "Run the telephony service that viewers connect to");
-    prepare(*serviceApp);
-    addService(*serviceApp, service);
-    BrowseOptions demo;
-    CLI::App* demoApp = app.add_subcommand("demo", "Browse a simulated modem");
-    prepare(*demoApp);
-    addDemo(*demoApp, demo.simulation.emplace(), demo.play);
-    addView(*demoApp, demo);
-    SimulateOptions simulate;
-    CLI::App* simulateApp =
-        app.add_subcommand("simulate", "Write a simulated modem's packets as a recording");
-    prepare(*simulateApp);
-    addSimulate(*simulateApp, simulate);
-
-    const std::string first = arguments.empty() ? "" : arguments.front();
-    std::reverse(arguments.begin(), arguments.end()); // as CLI11 takes them
-    try {
-        app.parse(arguments);
-    } catch (const CLI::ParseError& error) {
-        return parseEnd(app, error);
-    }
-    for (const CLI::App* command : app.get_subcommands()) {
-        if (command->get_name() != first) {
-            return wrongUsage("the command \"" + command->get_name() +
-                              "\" must come first, without options before it");
-        }
-    }
-    if (loopsStandardInput(browse.recording.value_or(""), browse.play) ||
-        loopsStandardInput(service.options.recording, service.options.play)) {
-        return wrongUsage("standard input can be played only once, not with --loop");
-    }
-    if (record.files.path == "-" && record.files.rotates()) {
-        return wrongUsage("standard output is one recording, without --rotate-size and "
-                          "--rotate-seconds");
-    }
-    if (recordApp->parsed()) {
-        return record;
-    }
-    if (decodeApp->parsed()) {
-        return decode;
-    }
-    if (serviceApp->parsed()) {
-        return serviceOptions(service);
-    }
-    if (demoApp->parsed()) {
-        return demo;
-    }
-    if (simulateApp->parsed()) {
-        return simulate;
-    }
-    return browse;
+    return CommandLine().parse(std::move(arguments));
 }
 
 } // namespace pallax

@@ -12,6 +12,10 @@
 #include <variant>
 #include <vector>
 
+namespace CLI {
+class App;
+} // namespace CLI
+
 namespace pallax {
 
 struct BrowseOptions {
@@ -36,6 +40,16 @@ struct ServiceStatusOptions {};
 
 using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions,
                                    ServiceStatusOptions, SimulateOptions, ParseEnd>;
+
+/// What browsing, decoding and recording take. The options outlive the app.
+void addBrowse(CLI::App& app, BrowseOptions& options);
+void addDecode(CLI::App& app, DecodeOptions& options);
+void addRecord(CLI::App& app, RecordOptions& options);
+/// What is common to all ways of browsing.
+void addView(CLI::App& app, BrowseOptions& options);
+
+/// One sentence, without its full stop, about what cannot be understood.
+ParseEnd wrongUsage(std::string reason);
 
 /// `arguments` are those after the program's name.
 ParsedOptions parseOptions(std::vector<std::string> arguments);

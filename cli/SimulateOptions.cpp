@@ -78,7 +78,7 @@ CLI::Option* addTechnology(CLI::App& app, const std::string& name,
                         return take(each);
                     }
                 }
-                throw CLI::ValidationError("technology", "\"" + text + "\" is none of " + names);
+                throw unknownChoice("technology", text, names);
             },
             description)
         ->type_name(names);

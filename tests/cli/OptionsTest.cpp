@@ -2,6 +2,9 @@
 
 #include <gtest/gtest.h>
 
+#include <filesystem>
+#include <fstream>
+
 namespace pallax {
 namespace {
 
@@ -288,6 +291,46 @@ TEST(Options, WhatNobodyKnowsIsNamed) {
     for (const char* speed : {"-1", "nan", "inf", "fast", "1x", ""}) {
         EXPECT_NE(wrongUsage({"--speed", speed, "a"}).find("--speed"), std::string::npos);
     }
+}
+
+TEST(Options, AMistypedCommandOrChoiceIsAnsweredWithTheNearest) {
+    EXPECT_EQ(wrongUsage({"decod", "x"}),
+              "pallax: \"decod\" is neither a command nor a recording. Did you mean \"decode\"? "
+              "(pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"dmeo"}),
+              "pallax: \"dmeo\" is neither a command nor a recording. Did you mean \"demo\"? "
+              "(pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"simulate", "ltee"}),
+              "pallax: technology: \"ltee\" is none of ifx|gsm|cdma|lte|utran. Did you mean "
+              "\"lte\"? (pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"decode", "--every", "tcik", "a"}),
+              "pallax: --every: \"tcik\" is none of end|tick|packet. Did you mean \"tick\"? "
+              "(pallax --help tells more)\n");
+    EXPECT_EQ(parsed<BrowseOptions>({"drive"}).recording, "drive") << "near to nothing";
+}
+
+TEST(Options, ARecordingNamedNearlyLikeACommandIsBrowsed) {
+    const std::string here = std::filesystem::current_path();
+    const std::string folder = testing::TempDir() + "pallax-options";
+    std::filesystem::create_directories(folder);
+    std::filesystem::current_path(folder);
+    std::ofstream("decod") << "a recording";
+    EXPECT_EQ(parsed<BrowseOptions>({"decod"}).recording, "decod");
+    std::filesystem::current_path(here);
+    std::filesystem::remove_all(folder);
+}
+
+TEST(Options, CompletionAndManualAreTextsThatTheHelpDoesNotName) {
+    const ParseEnd script = ended({"completion", "bash"});
+    EXPECT_EQ(script.status, kExitSuccess);
+    EXPECT_NE(script.text.find("complete -F _pallax pallax\n"), std::string::npos);
+    EXPECT_EQ(wrongUsage({"completion", "csh"}),
+              "pallax: SHELL: \"csh\" is none of bash|zsh|fish. Did you mean \"zsh\"? (pallax "
+              "--help tells more)\n");
+    EXPECT_EQ(wrongUsage({"manual"}), "pallax: PAGE is required (pallax --help tells more)\n");
+    const std::string help = ended({"--help"}).text;
+    EXPECT_EQ(help.find("completion"), std::string::npos);
+    EXPECT_EQ(help.find("manual"), std::string::npos);
 }
 
 TEST(Options, StandardInputCannotBeLooped) {

@@ -1,0 +1,170 @@
+#include "cli/CommandLine.h"
+
+#include "cli/Completion.h"
+#include "cli/ManualPage.h"
+#include "cli/OptionParts.h"
+#include "cli/Suggestion.h"
+
+#include <CLI/CLI.hpp>
+
+#include <algorithm>
+#include <filesystem>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr const char* kVersionText = "pallax " PALLAX_VERSION;
+
+ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
+    if (dynamic_cast<const CLI::CallForVersion*>(&error) != nullptr) {
+        return {kExitSuccess, std::string(kVersionText) + "\n"};
+    }
+    if (error.get_exit_code() == static_cast<int>(CLI::ExitCodes::Success)) {
+        return {kExitSuccess, app.help()};
+    }
+    return wrongUsage(error.what());
+}
+
+bool loopsStandardInput(std::string_view recording, const PlayOptions& play) {
+    return play.loop && recording == "-";
+}
+
+/// Help pages without the library's marks for what an option demands.
+class PlainFormatter final : public CLI::Formatter {
+public:
+    std::string make_option_opts(const CLI::Option* option) const override {
+        const std::string type = option->get_type_name();
+        return type.empty() ? "" : " " + type;
+    }
+};
+
+/// The help and version flags that every command has.
+void prepare(CLI::App& app) {
+    app.formatter(std::make_shared<PlainFormatter>());
+    app.set_help_flag("-h,--help", "Show this help and exit");
+    app.set_version_flag("--version", kVersionText, "Show the version and exit");
+}
+
+/// A required argument that is one of some names, each standing for itself.
+void addName(CLI::App& app, const std::string& argument, std::string& value,
+             const std::vector<std::string>& names, const std::string& description) {
+    std::vector<std::pair<std::string, std::string>> choices;
+    for (const std::string& name : names) {
+        choices.emplace_back(name, name);
+    }
+    addChoice(app, argument, value, choices, description)->required();
+}
+
+} // namespace
+
+CommandLine::CommandLine()
+    : _app(std::make_unique<CLI::App>("Pallax shows what a phone's cellular radio is doing.",
+                                      "pallax")) {
+    prepare(*_app);
+    addBrowse(*_app, _browse);
+    addDecode(addCommand("decode", "Recordings to JSON or CSV"), _decode);
+    addRecord(addCommand("record", "Write the live channel to a recording"), _record);
+    addService(addCommand("service", "Run the telephony service that viewers connect to"),
+               _service);
+    CLI::App& demo = addCommand("demo", "Browse a simulated modem");
+    addDemo(demo, _demo.simulation.emplace(), _demo.play);
+    addView(demo, _demo);
+    addSimulate(addCommand("simulate", "Write a simulated modem's packets as a recording"),
+                _simulate);
+    addTexts();
+}
+
+CommandLine::~CommandLine() = default;
+
+CLI::App& CommandLine::addCommand(const char* name, const char* description) {
+    CLI::App& command = *_app->add_subcommand(name, description);
+    prepare(command);
+    return command;
+}
+
+void CommandLine::addTexts() {
+    CLI::App& completion = addCommand("completion", "Write a shell's completion script");
+    CLI::App& manual = addCommand("manual", "Write a manual page");
+    for (CLI::App* hidden : {&completion, &manual}) {
+        hidden->footer("")->group("");
+    }
+    addName(completion, "SHELL", _shell, completionShells(), "Whose script");
+    addName(manual, "PAGE", _page, manualPages(description()), "Which page");
+}
+
+CommandDescription CommandLine::description() const {
+    return describe(*_app);
+}
+
+std::string CommandLine::mistypedCommand(const std::string& first) const {
+    std::error_code ignored;
+    const bool path = first.find('/') != std::string::npos;
+    if (path || first.starts_with('-') || std::filesystem::exists(first, ignored)) {
+        return "";
+    }
+    std::vector<std::string> names;
+    for (const CommandDescription& command : description().commands) {
+        if (command.name == first) {
+            return "";
+        }
+        names.push_back(command.name);
+    }
+    return suggestion(first, names);
+}
+
+ParsedOptions CommandLine::parse(std::vector<std::string> arguments) {
+    const std::string first = arguments.empty() ? "" : arguments.front();
+    if (const std::string meant = mistypedCommand(first); !meant.empty()) {
+        return wrongUsage("\"" + first + "\" is neither a command nor a recording" + meant);
+    }
+    std::reverse(arguments.begin(), arguments.end()); // as CLI11 takes them
+    try {
+        _app->parse(arguments);
+    } catch (const CLI::ParseError& error) {
+        return parseEnd(*_app, error);
+    }
+    for (const CLI::App* command : _app->get_subcommands()) {
+        if (command->get_name() != first) {
+            return wrongUsage("the command \"" + command->get_name() +
+                              "\" must come first, without options before it");
+        }
+    }
+    return chosen();
+}
+
+ParsedOptions CommandLine::chosen() const {
+    if (loopsStandardInput(_browse.recording.value_or(""), _browse.play) ||
+        loopsStandardInput(_service.options.recording, _service.options.play)) {
+        return wrongUsage("standard input can be played only once, not with --loop");
+    }
+    if (_record.files.path == "-" && _record.files.rotates()) {
+        return wrongUsage("standard output is one recording, without --rotate-size and "
+                          "--rotate-seconds");
+    }
+    if (!_shell.empty()) {
+        return ParseEnd{kExitSuccess, completionScript(description(), _shell)};
+    }
+    if (!_page.empty()) {
+        return ParseEnd{kExitSuccess, manualPage(description(), _page)};
+    }
+    if (_app->got_subcommand("record")) {
+        return _record;
+    }
+    if (_app->got_subcommand("decode")) {
+        return _decode;
+    }
+    if (_app->got_subcommand("service")) {
+        return serviceOptions(_service);
+    }
+    if (_app->got_subcommand("demo")) {
+        return _demo;
+    }
+    if (_app->got_subcommand("simulate")) {
+        return _simulate;
+    }
+    return _browse;
+}
+
+} // namespace pallax

@@ -1,0 +1,246 @@
+#include "cli/ManualPage.h"
+
+#include <algorithm>
+#include <sstream>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kExamples = "Examples:";
+constexpr std::string_view kStatuses = "Exit status: ";
+
+constexpr const char* kSurroundings = R"(.SH ENVIRONMENT
+.TP
+.B XDG_RUNTIME_DIR
+Where the sockets lie by which viewers and the service find each other, in its folder pallax.
+.TP
+.B XDG_CONFIG_HOME
+Where the settings lie, in its folder pallax.
+.TP
+.B PALLAX_RESOURCES
+The folder of the display templates, if it is not that of the installation.
+.TP
+.B NO_COLOR
+If set, the screen is drawn without colours.
+.SH FILES
+.TP
+.I ~/.config/pallax/pallax.conf
+The user's settings.
+.TP
+.I /etc/xdg/pallax/pallax.conf
+The system's settings, read where there are none of the user's.
+)";
+
+/// The text as roff shows it again: hyphens stay what is typed, nothing is a request.
+std::string escaped(std::string_view text) {
+    std::string result;
+    for (const char character : text) {
+        const bool lineStarts = result.empty() || result.back() == '\n';
+        if (lineStarts && (character == '.' || character == '\'')) {
+            result.append("\\&");
+        }
+        switch (character) {
+        case '\\':
+            result.append("\\e");
+            break;
+        case '-':
+            result.append("\\-");
+            break;
+        case '\'':
+            result.append("\\(aq");
+            break;
+        case '~':
+            result.append("\\(ti");
+            break;
+        case '^':
+            result.append("\\(ha");
+            break;
+        default:
+            result.push_back(character);
+        }
+    }
+    return result;
+}
+
+std::string bold(std::string_view text) {
+    return "\\fB" + escaped(text) + "\\fR";
+}
+
+std::string italic(std::string_view text) {
+    return "\\fI" + escaped(text) + "\\fR";
+}
+
+/// What is in lower case is typed as it stands, what is in upper case is filled in.
+std::string valueOf(std::string_view value) {
+    std::string result;
+    while (!value.empty()) {
+        const bool separates = value.find_first_of("|[]") == 0;
+        const std::string_view word =
+            separates ? value.substr(0, 1) : value.substr(0, value.find_first_of("|[]"));
+        const bool filledIn = word.size() > 1 && word.front() >= 'A' && word.front() <= 'Z';
+        result.append(separates                                ? std::string(word)
+                      : filledIn || word == "N" || word == "X" ? italic(word)
+                                                               : bold(word));
+        value.remove_prefix(word.size());
+    }
+    return result;
+}
+
+/// A description is a sentence without its full stop.
+std::string sentence(const std::string& text) {
+    return escaped(text) + (text.ends_with('.') ? "\n" : ".\n");
+}
+
+struct Footer {
+    std::string examples; ///< lines
+    std::string notes;    ///< paragraphs
+    std::string statuses; ///< "0 success, 1 failure, …"
+};
+
+/// Takes a help page's last part to pieces: paragraphs with an empty line between them.
+Footer takenApart(const std::string& footer) {
+    Footer parts;
+    for (std::string_view rest = footer; !rest.empty();) {
+        const std::string_view paragraph = rest.substr(0, rest.find("\n\n"));
+        rest.remove_prefix(std::min(paragraph.size() + 2, rest.size()));
+        if (paragraph.starts_with(kExamples)) {
+            parts.examples = paragraph.substr(kExamples.size() + 1);
+        } else if (paragraph.starts_with(kStatuses)) {
+            parts.statuses = paragraph.substr(kStatuses.size());
+        } else {
+            parts.notes.append(".PP\n" + escaped(paragraph) + "\n");
+        }
+    }
+    return parts;
+}
+
+std::string synopsis(const CommandDescription& program, const CommandDescription* command) {
+    std::string line = bold("pallax");
+    if (command != nullptr) {
+        line += " " + bold(command->name);
+    }
+    line += " [" + italic("OPTION") + "]...";
+    for (const OptionDescription& argument : (command != nullptr ? *command : program).arguments) {
+        const std::string name = italic(argument.names.front());
+        line += " " + (argument.required ? name : "[" + name + "]");
+        line += argument.repeats ? "..." : "";
+    }
+    if (command == nullptr) {
+        line += "\n.br\n" + bold("pallax") + " " + italic("COMMAND") + " ...";
+    }
+    return ".SH SYNOPSIS\n" + line + "\n";
+}
+
+std::string listOf(const char* title, const std::vector<OptionDescription>& options) {
+    std::string list = options.empty() ? "" : ".SH " + std::string(title) + "\n";
+    for (const OptionDescription& option : options) {
+        const bool argument = !option.names.front().starts_with('-');
+        std::string names;
+        for (const std::string& name : option.names) {
+            names.append(names.empty() ? "" : ", ").append(argument ? italic(name) : bold(name));
+        }
+        list += ".TP\n" + names + (option.value.empty() ? "" : " " + valueOf(option.value)) + "\n";
+        list += sentence(option.description);
+    }
+    return list;
+}
+
+std::string exitStatus(std::string_view statuses) {
+    std::string list = ".SH EXIT STATUS\n";
+    std::istringstream rest{std::string(statuses)};
+    for (std::string each; std::getline(rest, each, ',');) {
+        const std::size_t number = each.find_first_not_of(' ');
+        const std::size_t space = each.find(' ', number);
+        list += ".TP\n" + bold(each.substr(number, space - number)) + "\n";
+        list += sentence(each.substr(space + 1));
+    }
+    return list;
+}
+
+std::string commandsOf(const CommandDescription& program) {
+    std::string list = ".SH COMMANDS\n";
+    for (const CommandDescription& command : program.commands) {
+        list += ".TP\n" + bold("pallax " + command.name) + "\n";
+        list += escaped(command.description) + "; see\n.BR pallax\\-" + command.name + " (1).\n";
+    }
+    return list;
+}
+
+std::string seeAlso(const CommandDescription& program, const CommandDescription* command) {
+    std::string list = ".SH SEE ALSO\n";
+    if (command != nullptr) {
+        list += ".BR pallax (1),\n";
+    }
+    for (const CommandDescription& each : program.commands) {
+        if (&each != command) {
+            list += ".BR pallax\\-" + each.name + " (1),\n";
+        }
+    }
+    return list + ".BR pallax.conf (5),\n.BR pallax\\-recording (7)\n";
+}
+
+/// "Pallax shows that." as "shows that", for it stands behind the name.
+std::string_view titleOf(std::string_view description) {
+    constexpr std::string_view kSubject = "Pallax ";
+    if (description.starts_with(kSubject)) {
+        description.remove_prefix(kSubject.size());
+    }
+    return description.substr(0, description.find_last_not_of('.') + 1);
+}
+
+std::string upperCase(std::string text) {
+    for (char& character : text) {
+        character = character >= 'a' && character <= 'z' ? static_cast<char>(character - 'a' + 'A')
+                                                         : character;
+    }
+    return text;
+}
+
+std::string page(const CommandDescription& program, const CommandDescription* command) {
+    const CommandDescription& subject = command != nullptr ? *command : program;
+    const std::string name = command != nullptr ? "pallax-" + command->name : "pallax";
+    const Footer footer = takenApart(subject.footer);
+    std::string text = ".\\\" Written by \"pallax manual " + name + "\".\n";
+    text += ".TH " + escaped(upperCase(name)) +
+            " 1 " PALLAX_DATE " \"pallax " PALLAX_VERSION "\" Pallax\n";
+    text += ".SH NAME\n" + escaped(name) + " \\- " + escaped(titleOf(subject.description)) + "\n";
+    text += synopsis(program, command);
+    text += ".SH DESCRIPTION\n" + sentence(subject.description) + footer.notes;
+    text += listOf("ARGUMENTS", subject.arguments);
+    text += listOf("OPTIONS", subject.options);
+    if (command == nullptr) {
+        text += commandsOf(program);
+    }
+    text += ".SH EXAMPLES\n.EX\n" + escaped(footer.examples) + "\n.EE\n";
+    text += exitStatus(takenApart(program.footer).statuses);
+    if (command == nullptr) {
+        text += kSurroundings;
+    }
+    return text + seeAlso(program, command);
+}
+
+} // namespace
+
+std::vector<std::string> manualPages(const CommandDescription& program) {
+    std::vector<std::string> names{"pallax"};
+    for (const CommandDescription& command : program.commands) {
+        names.push_back("pallax-" + command.name);
+    }
+    return names;
+}
+
+std::string manualPage(const CommandDescription& program, std::string_view name) {
+    if (name == "pallax") {
+        return page(program, nullptr);
+    }
+    for (const CommandDescription& command : program.commands) {
+        if (name == "pallax-" + command.name) {
+            return page(program, &command);
+        }
+    }
+    return "";
+}
+
+} // namespace pallax

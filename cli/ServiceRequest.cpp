@@ -1,0 +1,82 @@
+#include "cli/ServiceRequest.h"
+
+#include "cli/OptionParts.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr const char* kServiceFooter = R"(Examples:
+  pallax service --play drive.pcap
+  pallax service --play drive.pcap --speed max --loop
+  pallax service --simulate lte --seed 7
+  pallax service --simulate ifx --seconds 600 --speed max
+  ssh phone modem-dump | pallax service --relay -
+  pallax service --status
+
+Every client gets a channel of its own. A recording or simulation begins anew for each; what is
+relayed goes to all as it comes, and the service ends with it. A client that is too slow loses packets and
+delays nobody; with --speed max it sets its own pace and loses nothing.)";
+
+void addServicePlay(CLI::App& app, ServiceOptions& options) {
+    CLI::Option* recording =
+        app.add_option("--play", options.recording, "The recording to play to each client")
+            ->type_name("RECORDING");
+    addSpeed(app, options.play);
+    app.add_flag("--loop", options.play.loop, "Begin again at the recording's end")
+        ->needs(recording);
+}
+
+void addServiceSimulated(CLI::App& app, std::optional<SimulationOptions>& simulation) {
+    addServiceSimulation(app, simulation)->excludes("--play");
+}
+
+void addServiceRelay(CLI::App& app, std::string& relayed) {
+    const auto take = [&relayed](const std::string& text) {
+        if (text != "-") {
+            throw CLI::ValidationError("--relay", "only -, standard input, can be relayed");
+        }
+        relayed = text;
+    };
+    app.add_option_function<std::string>(
+           "--relay", take, "Pass on the live pcap stream of standard input (-) to every client")
+        ->type_name("-")
+        ->excludes("--play")
+        ->excludes("--speed") // the stream has its own
+        ->excludes("--simulate");
+}
+
+void addServiceStatus(CLI::App& app, bool& status) {
+    app.add_flag("--status", status, "Print what the running service serves, and end")
+        ->excludes("--play")
+        ->excludes("--speed")
+        ->excludes("--simulate")
+        ->excludes("--relay");
+}
+
+} // namespace
+
+void addService(CLI::App& app, ServiceRequest& request) {
+    addServicePlay(app, request.options);
+    addServiceSimulated(app, request.options.simulation);
+    addServiceRelay(app, request.relayed);
+    addServiceStatus(app, request.status);
+    app.footer(kServiceFooter);
+}
+
+ParsedOptions serviceOptions(const ServiceRequest& request) {
+    if (request.status) {
+        return ServiceStatusOptions();
+    }
+    ServiceOptions options = request.options;
+    if (!request.relayed.empty()) {
+        options.recording = request.relayed;
+        options.relay = true;
+    }
+    if (options.recording.empty() && !options.simulation) {
+        return wrongUsage("the service needs --play, --simulate, --relay or --status");
+    }
+    return options;
+}
+
+} // namespace pallax

@@ -1,0 +1,142 @@
+#include "cli/Completion.h"
+
+#include "cli/CommandLine.h"
+#include "tests/packaging/Shell.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+
+namespace pallax {
+namespace {
+
+using doubles::isInstalled;
+using doubles::runCommand;
+
+std::string script(const char* shell) {
+    return completionScript(CommandLine().description(), shell);
+}
+
+class Completion : public testing::Test {
+protected:
+    Completion() {
+        folder.write("drive.pcap", "");
+        folder.write("other.pcap", "");
+    }
+
+    /// What a real shell prints for `lines`, one word a line, in a folder with two recordings.
+    std::string offered(const char* shell, const std::string& lines) const {
+        folder.write(".script", script(shell));
+        folder.write(".ask", lines);
+        const auto run = runCommand("cd " + folder.path() + " && " + shell + " ./.ask");
+        EXPECT_EQ(run.status, 0) << run.out;
+        return run.out;
+    }
+
+    /// What bash offers for the last of the words, which are split as it does.
+    std::string inBash(const std::string& words, int current) const {
+        return offered("bash", "set -u\nsource ./.script\nCOMP_WORDS=(" + words +
+                                   ")\nCOMP_CWORD=" + std::to_string(current) +
+                                   "\n_pallax\nfor each in \"${COMPREPLY[@]}\"; do "
+                                   "echo \"$each\"; done\n");
+    }
+
+    doubles::TemporaryFolder folder;
+};
+
+TEST_F(Completion, BashOffersCommands) {
+    EXPECT_EQ(inBash("pallax de", 1), "decode\ndemo\n");
+    folder.write("seven.pcap", "");
+    EXPECT_EQ(inBash("pallax s", 1), "service\nsimulate\nseven.pcap\n") << "and files";
+}
+
+TEST_F(Completion, BashOffersTheOptionsOfTheCommand) {
+    EXPECT_EQ(inBash("pallax record --rot", 2), "--rotate-size\n--rotate-seconds\n");
+    EXPECT_EQ(inBash("pallax --k", 1), "--keep-going\n");
+    EXPECT_EQ(inBash("pallax decode --k", 2), "");
+}
+
+TEST_F(Completion, BashOffersTheChoicesOfAnOption) {
+    EXPECT_EQ(inBash("pallax decode --every ''", 3), "end\ntick\npacket\n");
+    EXPECT_EQ(inBash("pallax decode --technology c", 3), "cdma\n");
+    EXPECT_EQ(inBash("pallax --color = n", 3), "never\n") << "--color=n comes as three words";
+    EXPECT_EQ(inBash("pallax --color =", 2), "auto\nalways\nnever\n");
+    EXPECT_EQ(inBash("pallax --speed ''", 2), "max\n");
+    EXPECT_EQ(inBash("pallax --log-level ''", 2), "0\n1\n2\n3\n4\n5\n6\n7\n");
+    EXPECT_EQ(inBash("pallax demo ''", 2), "ifx\ngsm\ncdma\nlte\nutran\n");
+    EXPECT_EQ(inBash("pallax demo --seed ''", 3), "") << "a number is the user's";
+}
+
+TEST_F(Completion, BashOffersFilesWhereARecordingOrFileIsTaken) {
+    EXPECT_EQ(inBash("pallax decode dr", 2), "drive.pcap\n");
+    EXPECT_EQ(inBash("pallax decode drive.pcap oth", 3), "other.pcap\n");
+    EXPECT_EQ(inBash("pallax dri", 1), "drive.pcap\n");
+    EXPECT_EQ(inBash("pallax service --play oth", 3), "other.pcap\n");
+    EXPECT_EQ(inBash("pallax simulate -o oth", 3), "other.pcap\n");
+    EXPECT_EQ(inBash("pallax demo dr", 2), "");
+}
+
+TEST_F(Completion, EveryOptionIsInEveryScript) {
+    const CommandDescription program = CommandLine().description();
+    ASSERT_EQ(program.commands.size(), 5U);
+    const std::string fish = script("fish");
+    for (const CommandDescription& command : program.commands) {
+        ASSERT_GT(command.options.size(), 3U);
+        for (const OptionDescription& option : command.options) {
+            for (const std::string& name : option.names) {
+                const bool isLong = name.starts_with("--");
+                EXPECT_NE(fish.find(isLong ? " -l " + name.substr(2) : " -s " + name.substr(1)),
+                          std::string::npos);
+                EXPECT_NE(
+                    script("zsh").find(")" + name + (option.value.empty() || !isLong ? "[" : "=[")),
+                    std::string::npos)
+                    << name;
+                EXPECT_NE(script("bash").find(name), std::string::npos) << name;
+            }
+        }
+    }
+}
+
+TEST_F(Completion, TheHiddenCommandsAreNotOffered) {
+    for (const char* shell : {"bash", "zsh", "fish"}) {
+        EXPECT_EQ(script(shell).find("manual"), std::string::npos) << shell;
+        EXPECT_TRUE(script(shell).starts_with("#")) << shell;
+    }
+    EXPECT_EQ(script("csh"), "");
+}
+
+TEST_F(Completion, FishOffersCommandsOptionsChoicesAndFiles) {
+    if (!isInstalled("fish")) {
+        GTEST_SKIP() << "fish is not installed";
+    }
+    const auto inFish = [this](const std::string& line) {
+        return offered("fish", "set -x HOME $PWD\nsource ./.script\ncomplete -C '" + line + "'\n");
+    };
+    EXPECT_EQ(inFish("pallax dec"), "decode\tRecordings to JSON or CSV\n");
+    EXPECT_EQ(inFish("pallax decode --ev"),
+              "--every\tWhen the display is written (default: end; for csv, tick)\n");
+    EXPECT_EQ(inFish("pallax simulate cd"), "cdma\n");
+    EXPECT_EQ(inFish("pallax --color n"), "never\tColour on the screen (default: auto, which is "
+                                          "never where NO_COLOR is set)\n");
+    EXPECT_EQ(inFish("pallax decode dr"), "drive.pcap\n");
+    EXPECT_EQ(inFish("pallax demo dr"), "");
+}
+
+TEST_F(Completion, ZshTakesTheScript) {
+    if (!isInstalled("zsh")) {
+        GTEST_SKIP() << "zsh is not installed";
+    }
+    // The completion system's functions only tell what they are asked for.
+    const std::string told =
+        offered("zsh", "compdef() { print compdef $* }\n_arguments() { print -l -- \"$@\" }\n"
+                       "source ./.script\nwords=(pallax simulate '')\nCURRENT=3\n_pallax\n");
+    EXPECT_TRUE(told.starts_with("compdef _pallax pallax\n-s\n")) << told;
+    EXPECT_NE(told.find("\n(-o --output)-o[Where to; - is standard output]:FILE:_files\n"),
+              std::string::npos)
+        << told;
+    EXPECT_NE(told.find(":ifx|gsm|cdma|lte|utran:(ifx gsm cdma lte utran)\n"), std::string::npos)
+        << told;
+}
+
+} // namespace
+} // namespace pallax

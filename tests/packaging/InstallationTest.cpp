@@ -1,0 +1,140 @@
+#include "cli/CommandLine.h"
+#include "cli/Completion.h"
+#include "cli/ManualPage.h"
+#include "tests/packaging/Shell.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <set>
+
+namespace pallax {
+namespace {
+
+namespace fs = std::filesystem;
+using doubles::contentOf;
+using doubles::isInstalled;
+using doubles::runCommand;
+
+/// An installation into a prefix that nobody else knows.
+class Installation : public testing::Test {
+protected:
+    Installation() {
+        const auto run =
+            runCommand(PALLAX_CMAKE " --install " PALLAX_BINARY_DIR " --prefix " + prefix.path());
+        EXPECT_EQ(run.status, 0) << run.out;
+    }
+
+    /// The files of a folder of the installation, from there on.
+    std::set<std::string> files(const std::string& folder) const {
+        std::set<std::string> names;
+        const fs::path root = prefix.path(folder);
+        for (const auto& entry : fs::recursive_directory_iterator(root)) {
+            if (entry.is_regular_file()) {
+                names.insert(fs::relative(entry.path(), root).string());
+            }
+        }
+        return names;
+    }
+
+    doubles::TemporaryFolder prefix;
+};
+
+TEST_F(Installation, TheInstalledProgramDecodesARecordingWithTheInstalledTemplates) {
+    const std::string decode =
+        prefix.path("bin/pallax") + " decode " PALLAX_SOURCE_DIR "/samples/gsm-attach.pcap";
+    const auto run = runCommand("env -u PALLAX_RESOURCES " + decode);
+    EXPECT_EQ(run.status, 0) << run.out;
+    EXPECT_TRUE(run.out.starts_with("{\"")) << run.out;
+
+    // Its own templates are what it reads: without them, the folder is there but empty.
+    for (const std::string& name : files("share/pallax")) {
+        fs::remove(prefix.path("share/pallax/" + name));
+    }
+    const auto without = runCommand("env -u PALLAX_RESOURCES " + decode);
+    EXPECT_EQ(without.status, 1);
+    EXPECT_EQ(without.out, "pallax: There are no display templates in " +
+                               prefix.path("share/pallax") +
+                               "; PALLAX_RESOURCES names their folder.\n");
+}
+
+TEST_F(Installation, EveryManualPageAndCompletionIsThere) {
+    std::set<std::string> pages{"man5/pallax.conf.5", "man7/pallax-recording.7"};
+    const CommandDescription program = CommandLine().description();
+    for (const std::string& name : manualPages(program)) {
+        pages.insert("man1/" + name + ".1");
+        EXPECT_EQ(contentOf(prefix.path("share/man/man1/" + name + ".1")),
+                  manualPage(program, name));
+    }
+    EXPECT_EQ(files("share/man"), pages);
+    EXPECT_EQ(contentOf(prefix.path("share/bash-completion/completions/pallax")),
+              completionScript(program, "bash"));
+    EXPECT_EQ(contentOf(prefix.path("share/zsh/site-functions/_pallax")),
+              completionScript(program, "zsh"));
+    EXPECT_EQ(contentOf(prefix.path("share/fish/vendor_completions.d/pallax.fish")),
+              completionScript(program, "fish"));
+}
+
+TEST_F(Installation, TheServiceUnitStartsTheInstalledProgram) {
+    const std::string unit = prefix.path("lib/systemd/user/pallax.service");
+    EXPECT_NE(contentOf(unit).find("\nExecStart=" + prefix.path("bin/pallax") +
+                                   " service $PALLAX_SERVICE\n"),
+              std::string::npos);
+    if (!isInstalled("systemd-analyze")) {
+        GTEST_SKIP() << "systemd-analyze is not installed; the unit is not checked further";
+    }
+    const auto run = runCommand("XDG_RUNTIME_DIR=" + prefix.path() +
+                                " SYSTEMD_LOG_LEVEL=warning systemd-analyze verify --user "
+                                "--man=no --recursive-errors=no " +
+                                unit);
+    EXPECT_EQ(run.status, 0);
+    EXPECT_EQ(run.out, "");
+}
+
+TEST_F(Installation, TheDesktopEntryOpensRecordingsInATerminal) {
+    const std::string entry = contentOf(prefix.path("share/applications/pallax.desktop"));
+    for (const char* line :
+         {"Terminal=true", "Exec=pallax %f", "MimeType=application/x-pallax-recording;"}) {
+        EXPECT_NE(entry.find(std::string("\n") + line + "\n"), std::string::npos) << line;
+    }
+}
+
+TEST_F(Installation, TheTypeOfRecordingsIsTakenByTheDatabase) {
+    if (!isInstalled("update-mime-database")) {
+        GTEST_SKIP() << "update-mime-database is not installed";
+    }
+    const auto run = runCommand("XDG_DATA_DIRS=" + prefix.path("share") + " update-mime-database " +
+                                prefix.path("share/mime"));
+    EXPECT_EQ(run.status, 0) << run.out;
+    EXPECT_EQ(run.out, "");
+    EXPECT_NE(contentOf(prefix.path("share/mime/globs2"))
+                  .find(":application/x-pallax-recording:*.pcapng\n"),
+              std::string::npos);
+}
+
+TEST(Package, TheDebianPackageRunsFromWhereItIsUnpacked) {
+    if (!isInstalled("dpkg-deb") || !isInstalled("dpkg-shlibdeps")) {
+        GTEST_SKIP() << "dpkg-dev is not installed";
+    }
+    const doubles::TemporaryFolder folder;
+    const auto made = runCommand(
+        PALLAX_CPACK " --config " PALLAX_BINARY_DIR "/CPackConfig.cmake -B " + folder.path("made"));
+    ASSERT_EQ(made.status, 0) << made.out;
+    const std::string package = folder.path("made") + "/pallax_*.deb";
+    const std::string depends = runCommand("dpkg-deb -f " + package + " Depends").out;
+    for (const char* library : {"libc6 ", "libncursesw6 ", "libpcap0.8 ", "libpugixml1v5 "}) {
+        EXPECT_NE(depends.find(library), std::string::npos) << depends;
+    }
+    ASSERT_EQ(runCommand("dpkg-deb -x " + package + " " + folder.path("root")).status, 0);
+    EXPECT_NE(contentOf(folder.path("root/usr/lib/systemd/user/pallax.service"))
+                  .find("\nExecStart=/usr/bin/pallax service "),
+              std::string::npos);
+    EXPECT_TRUE(fs::exists(folder.path("root/usr/share/zsh/vendor-completions/_pallax")));
+    const auto demo = runCommand("env -u PALLAX_RESOURCES " + folder.path("root/usr/bin/pallax") +
+                                 " demo --print --seconds 4 --speed max");
+    EXPECT_EQ(demo.status, 0);
+    EXPECT_NE(demo.out.find("\nServing Cell Info\n"), std::string::npos) << demo.out;
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,115 @@
+#include "cli/ManualPage.h"
+
+#include "cli/CommandLine.h"
+#include "tests/packaging/Shell.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <regex>
+
+namespace pallax {
+namespace {
+
+using doubles::contentOf;
+using doubles::isInstalled;
+using doubles::runCommand;
+
+/// The page's text without roff's marks.
+std::string plain(const std::string& page) {
+    return std::regex_replace(std::regex_replace(page, std::regex(R"(\\f[BIR])"), ""),
+                              std::regex(R"(\\-)"), "-");
+}
+
+CommandDescription program() {
+    return CommandLine().description();
+}
+
+TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
+    EXPECT_EQ(manualPages(program()),
+              (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record",
+                                        "pallax-service", "pallax-demo", "pallax-simulate"}));
+    EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
+}
+
+TEST(ManualPage, EveryOptionIsOnItsPageWithItsValueAndDescription) {
+    std::vector<CommandDescription> all = program().commands;
+    all.push_back(program());
+    for (const CommandDescription& command : all) {
+        const std::string name = command.name == "pallax" ? "pallax" : "pallax-" + command.name;
+        const std::string page = plain(manualPage(program(), name));
+        ASSERT_GT(command.options.size(), 3U);
+        for (const OptionDescription& option : command.options) {
+            std::string names;
+            for (const std::string& each : option.names) {
+                names += (names.empty() ? "" : ", ") + each;
+            }
+            const std::string item =
+                ".TP\n" + names + (option.value.empty() ? "" : " " + option.value) + "\n";
+            EXPECT_NE(page.find(item +
+                                std::regex_replace(option.description, std::regex("'"), "\\(aq") +
+                                ".\n"),
+                      std::string::npos)
+                << item << option.description << "\n"
+                << page;
+        }
+        for (const OptionDescription& argument : command.arguments) {
+            EXPECT_NE(page.find(".TP\n" + argument.names.front()), std::string::npos) << page;
+        }
+        for (const char* status :
+             {"0\nsuccess.", "1\nfailure.", "2\nwrong usage.", "70\nended by a fatal record."}) {
+            EXPECT_NE(page.find(std::string(".TP\n") + status), std::string::npos) << page;
+        }
+    }
+}
+
+TEST(ManualPage, TheProgramWritesIt) {
+    const auto end = std::get<ParseEnd>(parseOptions({"manual", "pallax-record"}));
+    EXPECT_EQ(end.status, kExitSuccess);
+    EXPECT_EQ(end.text, manualPage(program(), "pallax-record"));
+    EXPECT_TRUE(end.text.starts_with(".\\\" Written by \"pallax manual pallax-record\".\n"
+                                     ".TH PALLAX\\-RECORD 1 "));
+    const auto wrong = std::get<ParseEnd>(parseOptions({"manual", "pallax-recrod"}));
+    EXPECT_EQ(wrong.status, kExitWrongUsage);
+    EXPECT_NE(wrong.text.find(". Did you mean \"pallax-record\"?"), std::string::npos);
+}
+
+TEST(ManualPage, TheSettingsPageNamesEverySetting) {
+    const std::string page = plain(contentOf(PALLAX_SOURCE_DIR "/docs/man/pallax.conf.5"));
+    for (const char* setting : {"on-fatal-record", "snapshot-directory", "save-button-marker"}) {
+        EXPECT_NE(page.find(std::string(".BR ") + setting), std::string::npos) << setting;
+    }
+}
+
+TEST(ManualPage, TheRecordingPageNamesEveryLinkType) {
+    const std::string page = contentOf(PALLAX_SOURCE_DIR "/docs/man/pallax-recording.7");
+    for (const RecordedTechnology& each : recordedTechnologies()) {
+        const std::string row =
+            std::to_string(each.linkType) + "|USER" + std::to_string(each.linkType - 147) + "|" +
+            std::string(each.identifier) + "|" + std::string(each.commandName) + "\n";
+        EXPECT_NE(page.find(row), std::string::npos) << row;
+    }
+}
+
+TEST(ManualPage, NoPageMakesTheFormatterComplain) {
+    if (!isInstalled("man") || !isInstalled("groff")) {
+        GTEST_SKIP() << "man and groff are not installed";
+    }
+    const doubles::TemporaryFolder folder;
+    std::vector<std::string> files{PALLAX_SOURCE_DIR "/docs/man/pallax.conf.5",
+                                   PALLAX_SOURCE_DIR "/docs/man/pallax-recording.7"};
+    for (const std::string& name : manualPages(program())) {
+        files.push_back(folder.write(name + ".1", manualPage(program(), name)));
+    }
+    for (const std::string& file : files) {
+        const auto man = runCommand("man --warnings -l " + file + " >/dev/null");
+        EXPECT_EQ(man.status, 0) << file;
+        EXPECT_EQ(man.out, "") << file;
+        const auto groff = runCommand("groff -t -man -Tutf8 -ww " + file + " >/dev/null");
+        EXPECT_EQ(groff.status, 0) << file;
+        EXPECT_EQ(groff.out, "") << file;
+    }
+}
+
+} // namespace
+} // namespace pallax
