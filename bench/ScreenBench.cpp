@@ -91,5 +91,11 @@ void tickOf50000LeavesInOneFilteredPane(benchmark::State& state) {
 }
 BENCHMARK(tickOf50000LeavesInOneFilteredPane)->Unit(benchmark::kMillisecond);
 
+/// How the cost grows with the leaves of one pane.
+void growingTick(benchmark::State& state) {
+    tick(state, 1, static_cast<int>(state.range(0)), "");
+}
+BENCHMARK(growingTick)->RangeMultiplier(10)->Range(10, 100000)->Unit(benchmark::kMillisecond);
+
 } // namespace
 } // namespace pallax

@@ -101,7 +101,7 @@ protected:
 
 private:
     /// A dictionary of the list that was cleared last, where nobody else holds it, else a new one.
-    /// Made anew, the entries of its lists took half of the time of decoding a drive.
+    /// Made anew, the entries of one list took half of the time of decoding a UTRAN drive.
     DictionaryRef spareEntry();
 
     PropertyList _sectionRef; // shared with the live display, which owns it

@@ -17,7 +17,7 @@ class PallaxModelNode;
 using NodeRef = std::shared_ptr<const PallaxModelNode>;
 
 /// Path ("/Serving Cell/ARFCN") to node. Its entries lie in a few big blocks, which are freed as a
-/// whole: allocated one by one they made a quarter of a tick of 50,000 leaves (bench/ScreenBench).
+/// whole: allocated one by one they made a third of a tick of 50,000 leaves (bench/ScreenBench).
 class PathDictionary {
     using Nodes = std::pmr::unordered_map<std::string, NodeRef>;
 
