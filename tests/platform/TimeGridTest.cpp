@@ -1,4 +1,5 @@
 #include "platform/TimeGrid.h"
+
 #include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>

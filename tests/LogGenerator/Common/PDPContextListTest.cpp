@@ -1,6 +1,6 @@
 #include "LogGenerator/Common/PDPContextList.h"
-#include "tests/doubles/Property.h"
 
+#include "tests/doubles/Property.h"
 #include "tests/doubles/PropertyListRecord.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"

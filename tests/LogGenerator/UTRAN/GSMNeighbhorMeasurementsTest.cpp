@@ -1,6 +1,6 @@
 #include "LogGenerator/UTRAN/GSMNeighbhorMeasurements.h"
-#include "tests/doubles/Property.h"
 
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
 

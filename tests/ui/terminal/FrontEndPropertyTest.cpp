@@ -1,5 +1,5 @@
-#include "tests/ui/terminal/StageScript.h"
 #include "tests/doubles/Property.h"
+#include "tests/ui/terminal/StageScript.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck.h>

@@ -1,6 +1,6 @@
 #include "ui/terminal/Grid.h"
-#include "tests/doubles/Property.h"
 
+#include "tests/doubles/Property.h"
 #include "tests/ui/terminal/GridSupport.h"
 
 #include <gtest/gtest.h>

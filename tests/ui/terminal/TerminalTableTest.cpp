@@ -1,6 +1,6 @@
 #include "ui/terminal/TerminalTable.h"
-#include "tests/doubles/Property.h"
 
+#include "tests/doubles/Property.h"
 #include "tests/ui/terminal/TextRows.h"
 #include "ui/terminal/TerminalToolkit.h"
 
