@@ -39,11 +39,13 @@ CLI::Option* addSeed(CLI::App& app, const std::function<void(std::uint64_t)>& ta
 }
 
 CLI::Option* addRate(CLI::App& app, const std::function<void(unsigned)>& take) {
+    // Fewer would not even hold what happens to the phone.
+    constexpr unsigned kLeast = 5;
     constexpr unsigned kMost = 1000000;
     return app
         .add_option_function<std::string>(
             "--rate",
-            [take](const std::string& text) { take(numberOf("--rate", text, 1U, kMost)); },
+            [take](const std::string& text) { take(numberOf("--rate", text, kLeast, kMost)); },
             "Packets a second (default: 40)")
         ->type_name("N");
 }

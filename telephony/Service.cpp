@@ -199,6 +199,9 @@ int printServiceStatus() {
     const std::string text = statusText(*status);
     const bool isPrinted =
         std::fwrite(text.data(), 1, text.size(), stdout) == text.size() && std::fflush(stdout) == 0;
+    if (!isPrinted) {
+        complain("Standard output cannot be written.");
+    }
     return isPrinted ? 0 : 1;
 }
 

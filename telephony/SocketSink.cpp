@@ -4,6 +4,7 @@
 #include "host/UnixSocket.h"
 
 #include <array>
+#include <sys/socket.h>
 #include <utility>
 
 namespace pallax {
@@ -97,7 +98,9 @@ void SocketSink::send() {
     while (_chunkSent < _chunk.size()) {
         const Transfer transfer = sendTo(_socket, Bytes(_chunk).subspan(_chunkSent));
         if (transfer.state == Transfer::State::Closed) {
-            return; // the watch for reading tells it
+            // The watch for reading tells it, also where only the sending has failed.
+            (void)::shutdown(_socket.number(), SHUT_RDWR);
+            return;
         }
         if (transfer.state == Transfer::State::WouldBlock) {
             _watch.onceWritable([this] { send(); });

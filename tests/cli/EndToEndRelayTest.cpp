@@ -14,6 +14,7 @@ namespace {
 
 using doubles::eventually;
 using doubles::PallaxProcess;
+using doubles::World;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
@@ -80,6 +81,32 @@ TEST_F(EndToEndRelay, AStreamGoesToEveryClientAsItComesAndTheServiceEndsWithIt) 
     viewer.signal(SIGTERM);
     EXPECT_EQ(viewer.wait(), 0);
     EXPECT_TRUE(eventually([this] { return world.sockets().empty(); }));
+}
+
+TEST(EndToEndRelayOfARecorder, ARecorderOnADeviceFeedsAViewerElsewhere) {
+    const World device;
+    const World desk;
+    const std::string pipe = desk.path("wire");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+    std::optional<Descriptor> both(
+        ::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // so that nobody waits
+    PallaxProcess modem(device,
+                        {"service", "--simulate", "lte", "--seconds", "20", "--speed", "10"});
+    ASSERT_TRUE(eventually([&] { return !device.sockets().empty(); }));
+    PallaxProcess recorder(device, {"record", "-"}, "/dev/null", pipe);
+    PallaxProcess relay(desk, {"service", "--relay", "-"}, pipe);
+    both.reset();
+    ASSERT_TRUE(eventually([&] { return !desk.sockets().empty(); }));
+    PallaxProcess viewer(desk, {"--print"});
+    EXPECT_TRUE(viewer.says("Serving Cell Measurements\n"));
+    EXPECT_TRUE(viewer.says("Measured RSRP: -"));
+    EXPECT_EQ(recorder.wait(), 0) << recorder.err();
+    EXPECT_EQ(relay.wait(), 0);
+    EXPECT_TRUE(relay.says("pallax: The stream has ended."));
+    viewer.signal(SIGTERM);
+    EXPECT_EQ(viewer.wait(), 0);
+    modem.signal(SIGTERM);
+    EXPECT_EQ(modem.wait(), 0);
 }
 
 TEST_F(EndToEndRelay, WhoComesLaterGetsWhatComesLater) {

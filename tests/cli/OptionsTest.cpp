@@ -199,7 +199,7 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
               "pallax: --seconds: \"0\" is no whole number from 1 to 31622400 (pallax --help "
               "tells more)\n");
     EXPECT_EQ(sentence({"demo", "--rate", "x"}),
-              "pallax: --rate: \"x\" is no whole number from 1 to 1000000 (pallax --help tells "
+              "pallax: --rate: \"x\" is no whole number from 5 to 1000000 (pallax --help tells "
               "more)\n");
     EXPECT_EQ(sentence({"simulate", "lte", "-o", "a"}),
               "pallax: --seconds is required (pallax --help tells more)\n");

@@ -188,7 +188,7 @@ TEST(Consistency, TheServingIfxCellIsNotItsOwnNeighbour) {
 }
 
 TEST(Consistency, OnGsmThereIsNeitherAnUmtsConnectionNorAnActiveUmtsCell) {
-    constexpr std::uint32_t kSearcher = 0x4005;
+    constexpr std::uint32_t kSearcher = 0x417A;
     std::size_t idle = 0;
     std::size_t searched = 0;
     std::string before;
