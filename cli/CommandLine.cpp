@@ -51,6 +51,7 @@ void prepare(CLI::App& app) {
 void addName(CLI::App& app, const std::string& argument, std::string& value,
              const std::vector<std::string>& names, const std::string& description) {
     std::vector<std::pair<std::string, std::string>> choices;
+    choices.reserve(names.size());
     for (const std::string& name : names) {
         choices.emplace_back(name, name);
     }

@@ -20,6 +20,7 @@ constexpr auto kScripts = std::to_array<std::pair<std::string_view, Script>>({
 
 std::vector<std::string> completionShells() {
     std::vector<std::string> shells;
+    shells.reserve(kScripts.size());
     for (const auto& [shell, script] : kScripts) {
         shells.emplace_back(shell);
     }

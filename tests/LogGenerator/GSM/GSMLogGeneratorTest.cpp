@@ -346,8 +346,9 @@ TEST(GSMLogGeneratorProperty, AnyBytesAreDisplayedOrLeaveTheStateAsItWas) {
             RC_TAG("refused");
             RC_ASSERT(PropertyList(stream.state).description() == before);
         } else {
-            RC_ASSERT(stream.value("Display") ==
-                      GSMLogGenerator::processObject(stream.value("DisplayState")));
+            // As texts: a number that is none equals nothing, not even itself.
+            const PropertyList shown = GSMLogGenerator::processObject(stream.value("DisplayState"));
+            RC_ASSERT(stream.value("Display").description() == shown.description());
         }
     }));
 }
