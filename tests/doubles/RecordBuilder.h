@@ -4,6 +4,7 @@
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/Bytes.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <initializer_list>
 
@@ -52,8 +53,9 @@ public:
     const ByteBuffer& bytes() const { return _bytes; }
     /// As the log channel delivers it, behind the 2-byte transport prefix.
     ByteBuffer prefixed() const {
-        ByteBuffer message = {0x81, 0x00};
-        message.insert(message.end(), _bytes.begin(), _bytes.end());
+        ByteBuffer message(2 + _bytes.size());
+        message[0] = 0x81;
+        std::copy(_bytes.begin(), _bytes.end(), message.begin() + 2);
         return message;
     }
 
