@@ -6,7 +6,7 @@ namespace pallax {
 
 namespace {
 
-std::string quoted(const std::string& text) {
+std::string shellQuoted(const std::string& text) {
     std::string result = "'";
     for (const char character : text) {
         if (character == '\'' || character == '\\') {
@@ -22,12 +22,12 @@ std::string choicesOf(const OptionDescription& option) {
     for (const std::string& choice : option.choices()) {
         choices.append(choices.empty() ? "" : " ").append(choice);
     }
-    return choices.empty() ? "" : " -a " + quoted(choices);
+    return choices.empty() ? "" : " -a " + shellQuoted(choices);
 }
 
 /// The lines for one command's options and arguments, which hold under `condition`.
 std::string linesOf(const CommandDescription& command, const std::string& condition) {
-    const std::string begin = "complete -c pallax -n " + quoted(condition);
+    const std::string begin = "complete -c pallax -n " + shellQuoted(condition);
     std::string lines;
     for (const OptionDescription& option : command.options) {
         lines.append(begin);
@@ -38,7 +38,7 @@ std::string linesOf(const CommandDescription& command, const std::string& condit
         if (!option.value.empty()) {
             lines.append(option.takesFile() ? " -r -F" : " -x").append(choicesOf(option));
         }
-        lines.append(" -d ").append(quoted(option.description)).append("\n");
+        lines.append(" -d ").append(shellQuoted(option.description)).append("\n");
     }
     for (const OptionDescription& argument : command.arguments) {
         lines.append(begin).append(argument.takesFile() ? " -F" : choicesOf(argument));
@@ -57,7 +57,7 @@ std::string fishCompletion(const CommandDescription& program) {
     for (const CommandDescription& command : program.commands) {
         names.append(" ").append(command.name);
         script.append("complete -c pallax -n '__fish_is_nth_token 1' -a " + command.name + " -d " +
-                      quoted(command.description) + "\n");
+                      shellQuoted(command.description) + "\n");
         lines.append("\n").append(linesOf(command, "__fish_seen_subcommand_from " + command.name));
     }
     script.append("\n").append(linesOf(program, "not __fish_seen_subcommand_from" + names));

@@ -5,7 +5,7 @@ namespace pallax {
 namespace {
 
 /// The text with a backslash before each of `special`, ready to stand between single quotes.
-std::string quoted(const std::string& text, std::string_view special) {
+std::string escaped(const std::string& text, std::string_view special) {
     std::string result;
     for (const char character : text) {
         if (character == '\'') {
@@ -31,7 +31,7 @@ std::string valueOf(const OptionDescription& option) {
         }
         action.append(")");
     }
-    return ":" + quoted(message, ":\\") + ":" + action;
+    return ":" + escaped(message, ":\\") + ":" + action;
 }
 
 std::string line(const std::string& entry) {
@@ -50,7 +50,7 @@ std::string linesOf(const CommandDescription& command) {
             std::string entry = "(";
             entry.append(exclusive).append(")").append(name);
             entry.append(valueMayJoin ? "=[" : "[");
-            entry.append(quoted(option.description, "[]\\")).append("]");
+            entry.append(escaped(option.description, "[]\\")).append("]");
             entry.append(option.value.empty() ? "" : valueOf(option));
             lines.append(line(entry));
         }
@@ -74,7 +74,7 @@ std::string zshCompletion(const CommandDescription& program) {
     std::string patterns;
     std::string functions;
     for (const CommandDescription& command : program.commands) {
-        commands.append("        '" + command.name + ":" + quoted(command.description, ":\\") +
+        commands.append("        '" + command.name + ":" + escaped(command.description, ":\\") +
                         "'\n");
         patterns.append(patterns.empty() ? "" : "|").append(command.name);
         functions.append(functionOf(command));
