@@ -2,6 +2,7 @@
 
 #include "platform/Format.h"
 
+#include <array>
 #include <cerrno>
 #include <cstdint>
 #include <cstring>
@@ -11,25 +12,30 @@ namespace pallax {
 
 namespace {
 
-void put32(ByteBuffer& out, std::uint32_t number) {
+/// Of numbers of 32 bits, low bytes first.
+template <std::size_t kCount>
+void append(ByteBuffer& out, const std::array<std::uint32_t, kCount>& numbers) {
     constexpr unsigned kBits = 32;
     constexpr unsigned kBitsPerByte = 8;
-    for (unsigned shift = 0; shift < kBits; shift += kBitsPerByte) {
-        out.push_back(static_cast<std::uint8_t>(number >> shift));
+    std::array<std::uint8_t, kCount * sizeof(std::uint32_t)> bytes{};
+    auto place = bytes.begin();
+    for (const std::uint32_t number : numbers) {
+        for (unsigned shift = 0; shift < kBits; shift += kBitsPerByte) {
+            *place++ = static_cast<std::uint8_t>(number >> shift);
+        }
     }
+    out.insert(out.end(), bytes.begin(), bytes.end());
 }
 
 /// The file's header, of 24 bytes.
 ByteBuffer fileHeader(int linkType) {
     constexpr std::uint32_t kNanosecondMagic = 0xA1B23C4D;
     constexpr std::uint32_t kVersion = 0x00040002; // 2.4, each half a 16-bit number
+    constexpr std::uint32_t kUtc = 0;
+    constexpr std::uint32_t kUnstatedAccuracy = 0;
     ByteBuffer header;
-    put32(header, kNanosecondMagic);
-    put32(header, kVersion);
-    put32(header, 0); // the stamps are UTC
-    put32(header, 0); // of unstated accuracy
-    put32(header, RecordingWriter::kLargestPacket);
-    put32(header, static_cast<std::uint32_t>(linkType));
+    append<6>(header, {kNanosecondMagic, kVersion, kUtc, kUnstatedAccuracy,
+                       RecordingWriter::kLargestPacket, static_cast<std::uint32_t>(linkType)});
     return header;
 }
 
@@ -69,10 +75,9 @@ std::optional<HostError> RecordingWriter::write(Time time, Bytes packet) {
         return HostError{"A packet before 1970 or after 2106 cannot be recorded."};
     }
     constexpr std::size_t kBlockSize = std::size_t{256} << 10U;
-    put32(_pending, static_cast<std::uint32_t>(seconds));
-    put32(_pending, static_cast<std::uint32_t>((time - second).count()));
-    put32(_pending, static_cast<std::uint32_t>(packet.size())); // captured
-    put32(_pending, static_cast<std::uint32_t>(packet.size())); // as it was
+    const auto length = static_cast<std::uint32_t>(packet.size()); // captured, and as it was
+    append<4>(_pending, {static_cast<std::uint32_t>(seconds),
+                         static_cast<std::uint32_t>((time - second).count()), length, length});
     _pending.insert(_pending.end(), packet.begin(), packet.end());
     const bool isDue = _flush == Flush::EachPacket || _pending.size() >= kBlockSize;
     return isDue ? flush() : std::nullopt;

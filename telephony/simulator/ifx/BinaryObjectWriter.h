@@ -2,6 +2,7 @@
 
 #include "platform/BinaryPropertyListFormat.h"
 #include "telephony/simulator/ifx/MessageBuffer.h"
+#include "telephony/simulator/ifx/ShortText.h"
 #include "telephony/simulator/ifx/Words.h"
 
 #include <array>
@@ -18,7 +19,7 @@ class BinaryObjectWriter {
 public:
     /// References are one byte wide.
     static constexpr std::size_t kMostObjects = 256;
-    static constexpr std::size_t kMostPending = 128;
+    static constexpr std::size_t kMostInContainer = 8;
     static constexpr std::size_t kDeepest = 8;
     static constexpr std::size_t kOffsetWidth = 2;
 
@@ -30,43 +31,53 @@ public:
     void emptyDictionary();
     void beginArray() { begin(); }
     void endArray();
-    void key(Word word) { put(_keys, static_cast<std::size_t>(word)); }
-    void text(Word word) { put(_values, static_cast<std::size_t>(word)); }
+    void key(Word word) { _open[_depth].keys.add(static_cast<std::size_t>(word)); }
+    void text(Word word) { _open[_depth].values.add(static_cast<std::size_t>(word)); }
     void text(std::string_view text);
+    void text(const ShortText& text);
     /// The message; the writer has done its work.
     void finish(ByteBuffer& out);
 
 private:
-    /// References that wait for the end of their containers.
-    using Pending = FixedBuffer<kMostPending>;
+    /// References that wait for the end of their container. They are kept as one number, the first
+    /// one in its low byte: written byte by byte and read at once, they cost a tenth of the time.
+    struct References {
+        std::uint64_t bytes = 0;
+        std::size_t count = 0;
+
+        void add(std::size_t object) {
+            constexpr unsigned kBitsPerByte = 8;
+            if (count == kMostInContainer) {
+                refuseMessage();
+            }
+            bytes |= std::uint64_t{object} << (kBitsPerByte * count++);
+        }
+        std::uint8_t* putTo(std::uint8_t* place) const;
+    };
     struct Open {
-        std::size_t firstKey;
-        std::size_t firstValue;
+        References keys;
+        References values; ///< and elements
     };
 
-    static void put(Pending& references, std::size_t object) {
-        references.put(static_cast<std::uint8_t>(object));
-    }
     void begin() {
         if (_depth == kDeepest) {
             refuseMessage();
         }
-        _open[_depth++] = {_keys.size(), _values.size()};
+        _open[++_depth] = {};
     }
-    Open innermost() {
+    const Open& end() {
         if (_depth == 0) {
             refuseMessage();
         }
-        return _open[--_depth];
+        return _open[_depth--];
     }
-    std::size_t beginObject(binary_form::Kind kind, std::size_t count);
+    std::uint8_t* beginObject(binary_form::Kind kind, std::size_t count, std::size_t length);
+    void endObject();
 
     MessageBuffer _message;
     FixedBuffer<kMostObjects * kOffsetWidth> _offsets;
     std::size_t _objects = kWords.size();
-    Pending _keys;
-    Pending _values; ///< and elements
-    std::array<Open, kDeepest> _open;
+    std::array<Open, kDeepest + 1> _open; ///< the first one holds the root
     std::size_t _depth = 0;
 };
 

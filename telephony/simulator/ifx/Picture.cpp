@@ -8,6 +8,10 @@ namespace pallax::ifx {
 
 namespace {
 
+// A list begins with its header.
+static_assert(1 + Picture::kMostNeighbours <= BinaryObjectWriter::kMostInContainer);
+static_assert(1 + Picture::kMostHopping <= BinaryObjectWriter::kMostInContainer);
+
 Word wordOf(RrState state) {
     switch (state) {
     case RrState::Off:
@@ -54,7 +58,7 @@ public:
 
 private:
     template <class Text>
-    void wrapped(Word key, Text text) {
+    void wrapped(Word key, const Text& text) {
         _writer.beginDictionary();
         _writer.key(key);
         _writer.text(text);
@@ -66,7 +70,7 @@ private:
     }
     void entry(Word key, const ShortText& value) {
         _writer.key(key);
-        _writer.text(value.view());
+        _writer.text(value);
     }
     template <class Number>
     void entry(Word key, Number number) {
@@ -77,7 +81,7 @@ private:
     }
     void level(Word key, int level_dbm) {
         _writer.key(key);
-        wrapped(Word::Value, ShortText(level_dbm).then(" dBm").view());
+        wrapped(Word::Value, ShortText(level_dbm).then(" dBm"));
     }
 
     void network(bool isRegistered);
@@ -152,7 +156,7 @@ void Teller<Writer>::dedicated(const DedicatedChannel& channel) {
         _writer.beginArray();
         _writer.text(Word::HoppingHeader);
         for (const unsigned arfcn : channel.hopping) {
-            _writer.text(ShortText(arfcn).view());
+            _writer.text(ShortText(arfcn));
         }
         _writer.endArray();
     }

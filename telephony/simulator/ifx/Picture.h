@@ -48,7 +48,7 @@ enum class RrState { Off, Selection, Establishment, Idle, Dedicated, Release };
 /// All that a message tells.
 struct Picture {
     static constexpr std::size_t kMostNeighbours = 6;
-    static constexpr std::size_t kMostHopping = 8;
+    static constexpr std::size_t kMostHopping = 7;
 
     bool isRegistered;
     RrState state;

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "telephony/simulator/ifx/MessageBuffer.h"
+
 #include <array>
 #include <charconv>
 #include <cstddef>
@@ -33,7 +35,8 @@ private:
         _size = static_cast<std::size_t>(end - _letters.data());
     }
 
-    std::array<char, 32> _letters; // two numbers of at most 11 letters, and what is between them
+    // Two numbers of at most 11 letters, and what is between them.
+    std::array<char, kShortPiece> _letters{};
     std::size_t _size = 0;
 };
 

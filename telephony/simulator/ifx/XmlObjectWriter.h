@@ -1,6 +1,7 @@
 #pragma once
 
 #include "telephony/simulator/ifx/MessageBuffer.h"
+#include "telephony/simulator/ifx/ShortText.h"
 #include "telephony/simulator/ifx/Words.h"
 
 #include <cstddef>
@@ -21,6 +22,7 @@ public:
     void endArray() { end("</array>\n"); }
     void key(Word word) { element("<key>", textOf(word), "</key>\n"); }
     void text(Word word) { text(textOf(word)); }
+    void text(const ShortText& text) { this->text(text.view()); }
     void text(std::string_view text) { element("<string>", text, "</string>\n"); }
     /// The message; the writer has done its work.
     void finish(ByteBuffer& out);
