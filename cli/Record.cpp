@@ -51,6 +51,9 @@ ExitStatus record(const RecordOptions& options) {
         return kExitFailure;
     }
     const auto files = RecordingFiles::open(options.files);
+    if (!files && files.error().readerHasGone) {
+        return kExitSuccess;
+    }
     if (!files) {
         complain(files.error().sentence);
         return kExitFailure;

@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <cstring>
 #include <limits>
+#include <string_view>
 
 namespace pallax {
 
@@ -17,6 +18,11 @@ void put32(ByteBuffer& out, std::uint32_t number) {
     for (unsigned shift = 0; shift < kBits; shift += kBitsPerByte) {
         out.push_back(static_cast<std::uint8_t>(number >> shift));
     }
+}
+
+HostError failureOf(std::string_view name, int error) {
+    return {formatText("The recording %@ cannot be written: %@.", {name, std::strerror(error)}),
+            error == EPIPE};
 }
 
 /// The file's header, of 24 bytes.
@@ -39,8 +45,7 @@ Result<std::unique_ptr<RecordingWriter>, HostError>
 RecordingWriter::create(const std::string& path, int linkType, Flush flush) {
     std::FILE* file = path == "-" ? stdout : std::fopen(path.c_str(), "wbe");
     if (file == nullptr) {
-        return HostError{
-            formatText("The recording %@ cannot be written: %@.", {path, std::strerror(errno)})};
+        return failureOf(path, errno);
     }
     std::unique_ptr<RecordingWriter> writer(
         new RecordingWriter(path == "-" ? "standard output" : path, file, flush));
@@ -84,8 +89,7 @@ std::optional<HostError> RecordingWriter::flush() {
         std::fflush(_file) == 0;
     _pending.clear();
     if (!isWritten) {
-        return HostError{
-            formatText("The recording %@ cannot be written: %@.", {_name, std::strerror(errno)})};
+        return failureOf(_name, errno);
     }
     return std::nullopt;
 }
