@@ -2,7 +2,6 @@
 #include "cli/Output.h"
 #include "cli/Programs.h"
 #include "telephony/ChildService.h"
-#include "telephony/simulator/SimulatedRecording.h"
 
 #include <csignal>
 #include <cstdio>
@@ -25,14 +24,7 @@ struct Run {
     ExitStatus operator()(const ServiceStatusOptions& /*options*/) const {
         return printServiceStatus() == 0 ? kExitSuccess : kExitFailure;
     }
-    ExitStatus operator()(const SimulateOptions& options) const {
-        const auto error = writeSimulatedRecording(options.simulation, options.file);
-        if (!error || error->readerHasGone) {
-            return kExitSuccess;
-        }
-        complain(error->sentence);
-        return kExitFailure;
-    }
+    ExitStatus operator()(const SimulateOptions& options) const { return runSimulate(options); }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);
