@@ -29,7 +29,7 @@ struct OptionDescription {
 struct CommandDescription {
     std::string name;        ///< "decode"; the program's own for the whole
     std::string description; ///< of the command itself
-    std::string footer;      ///< examples, an empty line, then paragraphs
+    std::string footer;      ///< what HelpText takes apart
     std::vector<OptionDescription> options;
     std::vector<OptionDescription> arguments;
     std::vector<CommandDescription> commands; ///< those that the help shows

@@ -1,6 +1,7 @@
 #include "cli/CommandLine.h"
 
 #include "cli/Completion.h"
+#include "cli/HelpFormatter.h"
 #include "cli/ManualPage.h"
 #include "cli/OptionParts.h"
 #include "cli/Suggestion.h"
@@ -17,6 +18,23 @@ namespace {
 
 constexpr const char* kVersionText = "pallax " PALLAX_VERSION;
 
+constexpr const char* kCompletionFooter = R"(Examples:
+  source <(pallax completion bash)
+  pallax completion fish > ~/.config/fish/completions/pallax.fish
+
+Exit status:
+  0   success
+  1   failure: the output cannot be written
+  2   wrong usage)";
+
+constexpr const char* kManualFooter = R"(Examples:
+  pallax manual pallax-decode | man -l -
+
+Exit status:
+  0   success
+  1   failure: the output cannot be written
+  2   wrong usage)";
+
 ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
     if (dynamic_cast<const CLI::CallForVersion*>(&error) != nullptr) {
         return {kExitSuccess, std::string(kVersionText) + "\n"};
@@ -24,25 +42,17 @@ ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
     if (error.get_exit_code() == static_cast<int>(CLI::ExitCodes::Success)) {
         return {kExitSuccess, app.help()};
     }
-    return wrongUsage(error.what());
+    const auto commands = app.get_subcommands();
+    return wrongUsage(error.what(), commands.empty() ? "" : commands.front()->get_name());
 }
 
 bool loopsStandardInput(std::string_view recording, const PlayOptions& play) {
     return play.loop && recording == "-";
 }
 
-/// Help pages without the library's marks for what an option demands.
-class PlainFormatter final : public CLI::Formatter {
-public:
-    std::string make_option_opts(const CLI::Option* option) const override {
-        const std::string type = option->get_type_name();
-        return type.empty() ? "" : " " + type;
-    }
-};
-
 /// The help and version flags that every command has.
 void prepare(CLI::App& app) {
-    app.formatter(std::make_shared<PlainFormatter>());
+    app.formatter(std::make_shared<HelpFormatter>());
     app.set_help_flag("-h,--help", "Show this help and exit");
     app.set_version_flag("--version", kVersionText, "Show the version and exit");
 }
@@ -82,15 +92,15 @@ CommandLine::~CommandLine() = default;
 CLI::App& CommandLine::addCommand(const char* name, const char* description) {
     CLI::App& command = *_app->add_subcommand(name, description);
     prepare(command);
+    command.group("Commands");
     return command;
 }
 
 void CommandLine::addTexts() {
     CLI::App& completion = addCommand("completion", "Write a shell's completion script");
     CLI::App& manual = addCommand("manual", "Write a manual page");
-    for (CLI::App* hidden : {&completion, &manual}) {
-        hidden->footer("")->group("");
-    }
+    completion.footer(kCompletionFooter)->group("");
+    manual.footer(kManualFooter)->group("");
     addName(completion, "SHELL", _shell, completionShells(), "Whose script");
     addName(manual, "PAGE", _page, manualPages(description()), "Which page");
 }
@@ -136,13 +146,17 @@ ParsedOptions CommandLine::parse(std::vector<std::string> arguments) {
 }
 
 ParsedOptions CommandLine::chosen() const {
-    if (loopsStandardInput(_browse.recording.value_or(""), _browse.play) ||
-        loopsStandardInput(_service.options.recording, _service.options.play)) {
-        return wrongUsage("standard input can be played only once, not with --loop");
+    constexpr const char* kLoops = "standard input can be played only once, not with --loop";
+    if (loopsStandardInput(_browse.recording.value_or(""), _browse.play)) {
+        return wrongUsage(kLoops);
+    }
+    if (loopsStandardInput(_service.options.recording, _service.options.play)) {
+        return wrongUsage(kLoops, "service");
     }
     if (_record.files.path == "-" && _record.files.rotates()) {
         return wrongUsage("standard output is one recording, without --rotate-size and "
-                          "--rotate-seconds");
+                          "--rotate-seconds",
+                          "record");
     }
     if (!_shell.empty()) {
         return ParseEnd{kExitSuccess, completionScript(description(), _shell)};

@@ -1,5 +1,7 @@
 #include "LogGenerator/Technologies/Technologies.h"
+#include "cli/DecodeProgress.h"
 #include "cli/DroppedNotices.h"
+#include "cli/MonotonicClock.h"
 #include "cli/OrderedWorkers.h"
 #include "cli/Preconditions.h"
 #include "cli/Programs.h"
@@ -20,27 +22,43 @@ namespace {
 
 /// Gives the command, wired to this machine, to `use`.
 template <class Use>
-ExitStatus withCommand(const DecodeOptions& options, const Use& use) {
+ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, const Use& use) {
     const DirectoryResources resources(DirectoryResources::programFolder());
     const BuildBundle bundle;
     DroppedNotices notices;
+    const auto report = [&progress](std::string_view sentence) {
+        progress.wipe();
+        complain(sentence);
+    };
     DecodeCommand command(options, {resources, bundle, notices, technologies()}, Recording::open,
-                          complain);
+                          report, &progress);
     return use(command);
 }
 
-ExitStatus decodeOneByOne(const DecodeOptions& options) {
-    Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
-    return withCommand(options, [&](DecodeCommand& command) { return command.run(output); });
+/// Whole lines at a time, which may come on the same terminal as the progress.
+Output::Write standardOutput(DecodeProgress& progress) {
+    return [&progress,
+            write = writeToDescriptor(STDOUT_FILENO, "Standard output")](std::string_view block) {
+        progress.wipe();
+        write(block);
+    };
+}
+
+ExitStatus decodeOneByOne(const DecodeOptions& options, DecodeProgress& progress) {
+    Output output(standardOutput(progress));
+    return withCommand(options, progress,
+                       [&](DecodeCommand& command) { return command.run(output); });
 }
 
 /// A worker's piece of the work, into its files.
-ExitStatus decodeInWorker(const DecodeOptions& options, std::size_t recording,
-                          const WorkerFiles& files) {
+ExitStatus decodeInWorker(const DecodeOptions& options, DecodeProgress& progress,
+                          std::size_t recording, const WorkerFiles& files) {
+    progress.becomeWorker();
     const auto decode = [&] {
         Output output(writeToDescriptor(STDOUT_FILENO, "A temporary file"));
-        return withCommand(
-            options, [&](DecodeCommand& command) { return command.runOne(recording, output); });
+        return withCommand(options, progress, [&](DecodeCommand& command) {
+            return command.runOne(recording, output);
+        });
     };
     if (!options.systemLog) {
         return decode();
@@ -65,13 +83,15 @@ ExitStatus decodeInWorker(const DecodeOptions& options, std::size_t recording,
 /// What the recordings give, in their order, as decoding one by one would have written it.
 class DecodeCollector {
 public:
-    DecodeCollector(const DecodeOptions& options, FileSink* log) : _options(options), _log(log) {}
+    DecodeCollector(const DecodeOptions& options, DecodeProgress& progress, FileSink* log)
+        : _options(options), _progress(progress), _log(log) {}
 
     ExitStatus status() const { return _status; }
 
     bool collect(std::size_t recording, const OrderedWorkers::Outcome& outcome,
                  const WorkerFiles& files) {
-        readWhole(files.output, writeToDescriptor(STDOUT_FILENO, "Standard output"));
+        readWhole(files.output, standardOutput(_progress));
+        _progress.wipe();
         readWhole(files.complaints, [](std::string_view sentences) {
             (void)std::fwrite(sentences.data(), 1, sentences.size(), stderr);
         });
@@ -88,21 +108,26 @@ public:
 
 private:
     const DecodeOptions& _options;
+    DecodeProgress& _progress;
     FileSink* _log;
     ExitStatus _status = kExitSuccess;
 };
 
-ExitStatus decodeAtOnce(const DecodeOptions& options, unsigned jobs, FileSink* log) {
-    OrderedWorkers workers(options.recordings.size(), jobs,
-                           [&options](std::size_t recording, const WorkerFiles& files) {
-                               return decodeInWorker(options, recording, files);
-                           });
-    DecodeCollector collector(options, log);
+ExitStatus decodeAtOnce(const DecodeOptions& options, DecodeProgress& progress, unsigned jobs,
+                        FileSink* log) {
+    OrderedWorkers workers(
+        options.recordings.size(), jobs,
+        [&](std::size_t recording, const WorkerFiles& files) {
+            return decodeInWorker(options, progress, recording, files);
+        },
+        [&progress] { progress.look(); });
+    DecodeCollector collector(options, progress, log);
     const auto error = workers.run(
         [&collector](std::size_t recording, const auto& outcome, const WorkerFiles& files) {
             return collector.collect(recording, outcome, files);
         });
     if (error) {
+        progress.wipe();
         complain(error->sentence);
         return kExitFailure;
     }
@@ -120,8 +145,11 @@ unsigned jobsFor(const DecodeOptions& options) {
 }
 
 ExitStatus decodeAll(const DecodeOptions& options, FileSink* log) {
+    const MonotonicClock clock;
+    DecodeProgress progress(options.recordings, TerminalLine::onStandardError(), clock);
     const unsigned jobs = jobsFor(options);
-    return jobs > 1 ? decodeAtOnce(options, jobs, log) : decodeOneByOne(options);
+    return jobs > 1 ? decodeAtOnce(options, progress, jobs, log)
+                    : decodeOneByOne(options, progress);
 }
 
 } // namespace

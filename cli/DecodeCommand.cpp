@@ -20,8 +20,8 @@ std::unique_ptr<DisplayOutput> displayOutput(const DecodeOptions& options, Outpu
 ExitStatus DecodeCommand::run(Output& output) {
     const auto displays = displayOutput(_options, output, true);
     ExitStatus status = kExitSuccess;
-    for (const std::string& path : _options.recordings) {
-        const ExitStatus result = decodePath(path, *displays);
+    for (std::size_t place = 0; place < _options.recordings.size(); ++place) {
+        const ExitStatus result = decodeNext(place, *displays);
         status = result == kExitSuccess ? status : result;
         if (result == kExitFatalRecord) {
             break;
@@ -33,8 +33,17 @@ ExitStatus DecodeCommand::run(Output& output) {
 
 ExitStatus DecodeCommand::runOne(std::size_t recording, Output& output) {
     const auto displays = displayOutput(_options, output, recording == 0);
-    const ExitStatus status = decodePath(_options.recordings.at(recording), *displays);
+    const ExitStatus status = decodeNext(recording, *displays);
     output.flush();
+    return status;
+}
+
+ExitStatus DecodeCommand::decodeNext(std::size_t place, DisplayOutput& output) {
+    _place = place;
+    const ExitStatus status = decodePath(_options.recordings.at(place), output);
+    if (_watcher != nullptr) {
+        _watcher->recordingDone(place);
+    }
     return status;
 }
 
@@ -70,6 +79,9 @@ ExitStatus DecodeCommand::decodePackets(Recording& recording, RecordingDecoder& 
             if (_options.strict) {
                 return kExitFatalRecord;
             }
+        }
+        if (_watcher != nullptr) {
+            _watcher->packetDone(_place, recording, decoder.packets());
         }
     }
     decoder.finish();

@@ -32,6 +32,17 @@ struct DecodeOptions {
     }
 };
 
+/// Is told how decoding goes on; the recordings are told by their place on the command line.
+class DecodeWatcher {
+public:
+    virtual ~DecodeWatcher() = default;
+    /// After each packet, of which `source` has given so many.
+    virtual void packetDone(std::size_t recording, const Recording& source,
+                            std::uint64_t packets) = 0;
+    /// At its end, also of one that could not be opened or read on.
+    virtual void recordingDone(std::size_t recording) = 0;
+};
+
 /// `pallax decode`: recordings to JSON or CSV, in the order of the command line, each with a
 /// generator and a state of its own. A recording that cannot be read does not keep the others
 /// from being decoded.
@@ -41,10 +52,11 @@ public:
     /// Gets one sentence for the user.
     using Report = std::function<void(std::string_view sentence)>;
 
+    /// The watcher, if any, outlives the command.
     DecodeCommand(const DecodeOptions& options, const DecoderEnvironment& environment, Open open,
-                  Report report)
+                  Report report, DecodeWatcher* watcher = nullptr)
         : _options(options), _environment(environment), _open(std::move(open)),
-          _report(std::move(report)) {}
+          _report(std::move(report)), _watcher(watcher) {}
 
     /// Writes to `output`, whose exceptions leave.
     ExitStatus run(Output& output);
@@ -53,6 +65,7 @@ public:
     ExitStatus runOne(std::size_t recording, Output& output);
 
 private:
+    ExitStatus decodeNext(std::size_t place, DisplayOutput& output);
     ExitStatus decodePath(const std::string& path, DisplayOutput& output);
     ExitStatus decode(Recording& recording, DisplayOutput& output);
     ExitStatus decodePackets(Recording& recording, RecordingDecoder& decoder);
@@ -61,6 +74,8 @@ private:
     DecoderEnvironment _environment;
     Open _open;
     Report _report;
+    DecodeWatcher* _watcher;
+    std::size_t _place = 0; // of the recording that is being decoded
 };
 
 } // namespace pallax

@@ -1,15 +1,12 @@
 #include "cli/ManualPage.h"
 
-#include <algorithm>
-#include <sstream>
+#include "cli/HelpText.h"
+
 #include <utility>
 
 namespace pallax {
 
 namespace {
-
-constexpr std::string_view kExamples = "Examples:";
-constexpr std::string_view kStatuses = "Exit status: ";
 
 constexpr const char* kSurroundings = R"(.SH ENVIRONMENT
 .TP
@@ -93,29 +90,6 @@ std::string sentence(const std::string& text) {
     return escaped(text) + (text.ends_with('.') ? "\n" : ".\n");
 }
 
-struct Footer {
-    std::string examples; ///< lines
-    std::string notes;    ///< paragraphs
-    std::string statuses; ///< "0 success, 1 failure, …"
-};
-
-/// Takes a help page's last part to pieces: paragraphs with an empty line between them.
-Footer takenApart(const std::string& footer) {
-    Footer parts;
-    for (std::string_view rest = footer; !rest.empty();) {
-        const std::string_view paragraph = rest.substr(0, rest.find("\n\n"));
-        rest.remove_prefix(std::min(paragraph.size() + 2, rest.size()));
-        if (paragraph.starts_with(kExamples)) {
-            parts.examples = paragraph.substr(kExamples.size() + 1);
-        } else if (paragraph.starts_with(kStatuses)) {
-            parts.statuses = paragraph.substr(kStatuses.size());
-        } else {
-            parts.notes.append(".PP\n" + escaped(paragraph) + "\n");
-        }
-    }
-    return parts;
-}
-
 std::string synopsis(const CommandDescription& program, const CommandDescription* command) {
     std::string line = bold("pallax");
     if (command != nullptr) {
@@ -147,16 +121,20 @@ std::string listOf(const char* title, const std::vector<OptionDescription>& opti
     return list;
 }
 
-std::string exitStatus(std::string_view statuses) {
+std::string exitStatus(const std::vector<HelpText::Status>& statuses) {
     std::string list = ".SH EXIT STATUS\n";
-    std::istringstream rest{std::string(statuses)};
-    for (std::string each; std::getline(rest, each, ',');) {
-        const std::size_t number = each.find_first_not_of(' ');
-        const std::size_t space = each.find(' ', number);
-        list += ".TP\n" + bold(each.substr(number, space - number)) + "\n";
-        list += sentence(each.substr(space + 1));
+    for (const HelpText::Status& status : statuses) {
+        list += ".TP\n" + bold(status.number) + "\n" + sentence(status.meaning);
     }
     return list;
+}
+
+std::string notesOf(const HelpText& text) {
+    std::string paragraphs;
+    for (const std::string& note : text.notes) {
+        paragraphs += ".PP\n" + escaped(note) + "\n";
+    }
+    return paragraphs;
 }
 
 std::string commandsOf(const CommandDescription& program) {
@@ -201,20 +179,20 @@ std::string upperCase(std::string text) {
 std::string page(const CommandDescription& program, const CommandDescription* command) {
     const CommandDescription& subject = command != nullptr ? *command : program;
     const std::string name = command != nullptr ? "pallax-" + command->name : "pallax";
-    const Footer footer = takenApart(subject.footer);
+    const HelpText help = takenApart(subject.footer);
     std::string text = ".\\\" Written by \"pallax manual " + name + "\".\n";
     text += ".TH " + escaped(upperCase(name)) +
             " 1 " PALLAX_DATE " \"pallax " PALLAX_VERSION "\" Pallax\n";
     text += ".SH NAME\n" + escaped(name) + " \\- " + escaped(titleOf(subject.description)) + "\n";
     text += synopsis(program, command);
-    text += ".SH DESCRIPTION\n" + sentence(subject.description) + footer.notes;
+    text += ".SH DESCRIPTION\n" + sentence(subject.description) + notesOf(help);
     text += listOf("ARGUMENTS", subject.arguments);
     text += listOf("OPTIONS", subject.options);
     if (command == nullptr) {
         text += commandsOf(program);
     }
-    text += ".SH EXAMPLES\n.EX\n" + escaped(footer.examples) + "\n.EE\n";
-    text += exitStatus(takenApart(program.footer).statuses);
+    text += ".SH EXAMPLES\n.EX\n" + escaped(help.examples) + "\n.EE\n";
+    text += exitStatus(help.statuses);
     if (command == nullptr) {
         text += kSurroundings;
     }

@@ -22,9 +22,14 @@ constexpr const char* kFooter = R"(Examples:
   pallax record drive.pcapng           write what the live modem sends to a file
   pallax service --play drive.pcap     let viewers connect to a played recording
 
-A recording that is named like a command is given with its folder: pallax ./decode
+Each command has a help of its own: pallax decode --help
+A recording named like a command is given with its folder: pallax ./decode
 
-Exit status: 0 success, 1 failure, 2 wrong usage, 70 ended by a fatal record.)";
+Exit status:
+  0   success, also when nobody reads the output any more
+  1   failure: one sentence on standard error tells which
+  2   wrong usage
+  70  ended by a fatal record (--keep-going drops it instead))";
 
 constexpr const char* kDecodeFooter = R"(Examples:
   pallax decode drive.pcap
@@ -32,15 +37,29 @@ constexpr const char* kDecodeFooter = R"(Examples:
   pallax decode --every packet --format csv --technology lte raw.pcap
   pallax decode --system-log drive.log drive.pcap
 
-Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is standard input.)";
+Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
+standard input. On a terminal, what takes more than two seconds shows how far it
+has come.
+
+Exit status:
+  0   success, also when nobody reads the output any more
+  1   failure: a recording cannot be read to its end, or the output be written
+  2   wrong usage
+  70  with --strict: ended by a fatal record)";
 
 constexpr const char* kRecordFooter = R"(Examples:
   pallax record drive.pcapng
   pallax record --technology lte --rotate-size 100M drive.pcapng
   pallax record - | ssh desk pallax service --relay -
 
-With --rotate-size or --rotate-seconds the files are drive-0001.pcapng, drive-0002.pcapng, ...
-Recording ends with Ctrl-C, and with the source. A viewer may run at the same time.)";
+With --rotate-size or --rotate-seconds the files are drive-0001.pcapng,
+drive-0002.pcapng, ... Recording ends with Ctrl-C, and with the source. A viewer
+may run at the same time.
+
+Exit status:
+  0   success: ended by Ctrl-C, by the source, or by the reader of the output
+  1   failure: the recording cannot be written, or the modem is another one
+  2   wrong usage)";
 
 void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
     addSpeed(app, play)->needs(recording);
@@ -162,9 +181,10 @@ void addRecord(CLI::App& app, RecordOptions& options) {
 }
 
 /// CLI11's messages may have several lines; the user gets one sentence.
-ParseEnd wrongUsage(std::string reason) {
+ParseEnd wrongUsage(std::string reason, const std::string& command) {
     std::replace(reason.begin(), reason.end(), '\n', ' ');
-    return {kExitWrongUsage, "pallax: " + reason + " (pallax --help tells more)\n"};
+    const std::string page = command.empty() ? "pallax" : "pallax " + command;
+    return {kExitWrongUsage, "pallax: " + reason + " (" + page + " --help tells more)\n"};
 }
 
 ParsedOptions parseOptions(std::vector<std::string> arguments) {

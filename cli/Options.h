@@ -48,8 +48,9 @@ void addRecord(CLI::App& app, RecordOptions& options);
 /// What is common to all ways of browsing.
 void addView(CLI::App& app, BrowseOptions& options);
 
-/// One sentence, without its full stop, about what cannot be understood.
-ParseEnd wrongUsage(std::string reason);
+/// One sentence, without its full stop, about what cannot be understood; the command's help, if one
+/// is named, tells more.
+ParseEnd wrongUsage(std::string reason, const std::string& command = {});
 
 /// `arguments` are those after the program's name.
 ParsedOptions parseOptions(std::vector<std::string> arguments);

@@ -40,6 +40,36 @@ Descriptor unnamedFile() {
     return file;
 }
 
+/// Blocks the signal of a child's end, or lets it through, and undoes that at the end.
+class ChildSignal {
+public:
+    explicit ChildSignal(int how) {
+        const sigset_t signal = only();
+        (void)::sigprocmask(how, &signal, &_before);
+    }
+    ~ChildSignal() { (void)::sigprocmask(SIG_SETMASK, &_before, nullptr); }
+    ChildSignal(const ChildSignal&) = delete;
+    ChildSignal& operator=(const ChildSignal&) = delete;
+
+    /// Until a child ends, or for a moment; it is to be blocked.
+    static void waitBriefly() {
+        constexpr long kNanoseconds = 100'000'000;
+        const timespec moment{0, kNanoseconds};
+        const sigset_t signal = only();
+        (void)::sigtimedwait(&signal, nullptr, &moment);
+    }
+
+private:
+    static sigset_t only() {
+        sigset_t signal{};
+        (void)::sigemptyset(&signal);
+        (void)::sigaddset(&signal, SIGCHLD);
+        return signal;
+    }
+
+    sigset_t _before{};
+};
+
 OrderedWorkers::Outcome outcomeOf(int waitStatus) {
     if (WIFSIGNALED(waitStatus)) {
         return {kExitFailure, false, WTERMSIG(waitStatus)};
@@ -83,7 +113,8 @@ OrderedWorkers::~OrderedWorkers() {
 }
 
 std::optional<HostError> OrderedWorkers::run(const Collect& collect) {
-    (void)std::signal(SIGCHLD, SIG_DFL); // whoever ignores it learns of no child's end
+    (void)std::signal(SIGCHLD, SIG_DFL);  // whoever ignores it learns of no child's end
+    const ChildSignal blocked(SIG_BLOCK); // it is waited for
     for (std::size_t piece = 0; piece < _pieces; ++piece) {
         while (_workers.empty() || !_workers.front().outcome) {
             std::optional<HostError> error;
@@ -133,6 +164,7 @@ std::optional<HostError> OrderedWorkers::startNext() {
 /// Ends without the ends of what the parent has begun: no destructor runs, no buffer is written.
 void OrderedWorkers::become(Worker& worker, std::size_t piece) const {
     (void)::prctl(PR_SET_PDEATHSIG, SIGKILL);
+    const ChildSignal unblocked(SIG_UNBLOCK);
     if (::dup2(worker.files.output.number(), STDOUT_FILENO) < 0 ||
         ::dup2(worker.files.complaints.number(), STDERR_FILENO) < 0) {
         ::_exit(kGaveUp);
@@ -146,9 +178,22 @@ void OrderedWorkers::become(Worker& worker, std::size_t piece) const {
     ::_exit(status);
 }
 
+/// Waits until a worker has ended; negative when that cannot be learnt.
+pid_t OrderedWorkers::nextEnded(int& status) const {
+    if (!_meanwhile) {
+        return ::waitpid(-1, &status, 0);
+    }
+    pid_t process = 0;
+    while ((process = ::waitpid(-1, &status, WNOHANG)) == 0) {
+        ChildSignal::waitBriefly();
+        _meanwhile();
+    }
+    return process;
+}
+
 void OrderedWorkers::waitForOne() {
     int status = 0;
-    const pid_t process = ::waitpid(-1, &status, 0);
+    const pid_t process = nextEnded(status);
     const bool lost = process < 0 && errno != EINTR;
     for (Worker& worker : _workers) {
         if (worker.process == process) {

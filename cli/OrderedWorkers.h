@@ -46,8 +46,11 @@ public:
     using Collect =
         std::function<bool(std::size_t piece, const Outcome& outcome, const WorkerFiles& files)>;
 
-    OrderedWorkers(std::size_t pieces, unsigned jobs, Work work)
-        : _pieces(pieces), _jobs(jobs), _work(std::move(work)) {}
+    /// Done here a few times a second while workers are waited for.
+    using Meanwhile = std::function<void()>;
+
+    OrderedWorkers(std::size_t pieces, unsigned jobs, Work work, Meanwhile meanwhile = {})
+        : _pieces(pieces), _jobs(jobs), _work(std::move(work)), _meanwhile(std::move(meanwhile)) {}
     /// Ends the workers that are left.
     ~OrderedWorkers();
     OrderedWorkers(const OrderedWorkers&) = delete;
@@ -66,11 +69,13 @@ private:
     std::size_t running() const;
     std::optional<HostError> startNext();
     [[noreturn]] void become(Worker& worker, std::size_t piece) const;
+    pid_t nextEnded(int& status) const;
     void waitForOne();
 
     std::size_t _pieces;
     unsigned _jobs;
     Work _work;
+    Meanwhile _meanwhile;
     std::deque<Worker> _workers; ///< those not collected, in order
     std::size_t _started = 0;
 };

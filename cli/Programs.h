@@ -12,6 +12,7 @@ namespace pallax {
 ExitStatus runDecode(const DecodeOptions& options);
 ExitStatus runBrowse(const BrowseOptions& options);
 ExitStatus runRecord(const RecordOptions& options);
+ExitStatus runSimulate(const SimulateOptions& options);
 
 /// "pallax: " and the sentence, on standard error.
 void complain(std::string_view sentence);

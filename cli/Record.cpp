@@ -3,13 +3,12 @@
 #include "cli/Recorder.h"
 #include "cli/ScopedLog.h"
 #include "cli/TeeSink.h"
+#include "cli/TerminalLine.h"
 #include "host/LogSinks.h"
 #include "platform/Format.h"
 
 #include <algorithm>
 #include <csignal>
-#include <cstdio>
-#include <unistd.h>
 
 namespace pallax {
 
@@ -18,27 +17,6 @@ namespace {
 /// What the machine's log gets: failures.
 constexpr int kSyslogLevel = static_cast<int>(LogPriority::Error);
 constexpr int kNothing = -1;
-
-/// One line of the terminal that is written again and again.
-class ProgressLine {
-public:
-    void show(const std::string& text) {
-        if (_isTerminal) {
-            _isShown = true;
-            (void)std::fprintf(stderr, "\r%s\033[K", text.c_str());
-        }
-    }
-    /// What is shown stays; what follows stands below.
-    void end() {
-        if (_isShown) {
-            (void)std::fputc('\n', stderr);
-        }
-    }
-
-private:
-    bool _isTerminal = ::isatty(STDERR_FILENO) != 0;
-    bool _isShown = false;
-};
 
 ExitStatus record(const RecordOptions& options) {
     if (const auto missing = missingTemplates()) {
@@ -51,18 +29,21 @@ ExitStatus record(const RecordOptions& options) {
         return kExitFailure;
     }
     const auto files = RecordingFiles::open(options.files);
+    if (!files && files.error().readerHasGone) {
+        return kExitSuccess;
+    }
     if (!files) {
         complain(files.error().sentence);
         return kExitFailure;
     }
-    ProgressLine progress;
+    TerminalLine progress = TerminalLine::onStandardError();
     std::optional<std::string> failure;
     {
         Recorder recorder(std::move(directory).value(), options.technology, **files,
                           [&progress](const std::string& text) { progress.show(text); });
         failure = recorder.run();
     }
-    progress.end();
+    progress.leave();
     if ((*files)->tooLarge() > 0) {
         complain(formatText("%llu packets of more than %zu bytes were left out.",
                             {(*files)->tooLarge(), PcapNgWriter::kLargestPacket}));

@@ -79,10 +79,13 @@ bool Recorder::replied(Bytes reply) {
 }
 
 void Recorder::packetArrived(Bytes packet) {
-    if (_technology == nullptr || _failure) {
+    if (_technology == nullptr || _isOver) {
         return;
     }
-    if (const auto error = _files.add(*_technology, stamp(), packet)) {
+    const auto error = _files.add(*_technology, stamp(), packet);
+    if (error && error->readerHasGone) {
+        stop();
+    } else if (error) {
         fail(formatText("%@ %llu packets are recorded.", {error->sentence, _files.packets()}));
     }
 }
@@ -107,6 +110,11 @@ void Recorder::fail(std::string sentence) {
     if (!_failure) {
         _failure = std::move(sentence);
     }
+    stop();
+}
+
+void Recorder::stop() {
+    _isOver = true;
     _link.queue().stop();
 }
 

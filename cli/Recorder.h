@@ -25,7 +25,8 @@ public:
     Recorder(SocketDirectory directory, const RecordedTechnology* wanted, RecordingFiles& files,
              Progress progress);
 
-    /// Records until a signal, the source's end or a failure: nothing, or the failure's sentence.
+    /// Records until a signal, the end of the source or of whoever reads a pipe, or a failure:
+    /// nothing, or the failure's sentence.
     std::optional<std::string> run();
 
     /// "120 packets, 4800 bytes, 50 packets/s", or that there is no modem yet.
@@ -45,6 +46,7 @@ private:
     Time stamp();
     void tellProgress();
     void fail(std::string sentence);
+    void stop();
 
     const RecordedTechnology* _wanted;
     RecordingFiles& _files;
@@ -54,6 +56,7 @@ private:
     std::optional<Time> _first;                      // stamp of the first packet
     Time _latest;                                    // the latest stamp
     std::chrono::nanoseconds _shift{0};              // from the source's time to the stamps
+    bool _isOver = false;                            // nothing more is written
     std::optional<std::string> _failure;
     std::uint64_t _packetsTold = 0;
     NoNotices _notices;

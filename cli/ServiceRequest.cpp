@@ -14,9 +14,15 @@ constexpr const char* kServiceFooter = R"(Examples:
   ssh phone modem-dump | pallax service --relay -
   pallax service --status
 
-Every client gets a channel of its own. A recording or simulation begins anew for each; what is
-relayed goes to all as it comes, and the service ends with it. A client that is too slow loses packets and
-delays nobody; with --speed max it sets its own pace and loses nothing.)";
+Every client gets a channel of its own. A recording or simulation begins anew
+for each; what is relayed goes to all as it comes, and the service ends with it.
+A client that is too slow loses packets and delays nobody; with --speed max it
+sets its own pace and loses nothing.
+
+Exit status:
+  0   success: ended by Ctrl-C, or by the whole of what was relayed
+  1   failure: nothing to serve, or a service runs already; --status: none runs
+  2   wrong usage)";
 
 void addServicePlay(CLI::App& app, ServiceOptions& options) {
     CLI::Option* recording =
@@ -74,7 +80,7 @@ ParsedOptions serviceOptions(const ServiceRequest& request) {
         options.relay = true;
     }
     if (options.recording.empty() && !options.simulation) {
-        return wrongUsage("the service needs --play, --simulate, --relay or --status");
+        return wrongUsage("the service needs --play, --simulate, --relay or --status", "service");
     }
     return options;
 }

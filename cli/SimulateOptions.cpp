@@ -16,13 +16,25 @@ constexpr const char* kDemoFooter = R"(Examples:
   pallax demo lte --seed 7 --speed 4   another car, four times as fast
   pallax demo --print --seconds 60 --speed max
 
-The same seed shows the same drive. Without --seconds it goes on until it is left.)";
+The same seed shows the same drive. Without --seconds it goes on until left.
+
+Exit status:
+  0   success, also when nobody reads the output any more
+  1   failure: the simulated modem cannot be started, or has ended too early
+  2   wrong usage)";
 
 constexpr const char* kSimulateFooter = R"(Examples:
   pallax simulate lte --seconds 3600 --rate 50 -o hour.pcap
   pallax simulate lte --seconds 60 -o - | pallax decode -
 
-The same technology, seed, rate and duration give the same file. An existing file is replaced.)";
+The same technology, seed, rate and duration give the same file. An existing
+file is replaced. On a terminal, what takes more than two seconds shows how far
+it has come.
+
+Exit status:
+  0   success, also when nobody reads the output any more
+  1   failure: the recording cannot be written
+  2   wrong usage)";
 
 constexpr const char* kUntilWhen = "End after so many simulated seconds (default: never)";
 
@@ -74,13 +86,13 @@ CLI::Option* addTechnology(CLI::App& app, const std::string& name,
     return app
         .add_option_function<std::string>(
             name,
-            [take, names](const std::string& text) {
+            [take, name, names](const std::string& text) {
                 for (const RecordedTechnology* each : simulatedTechnologies()) {
                     if (each->commandName == text) {
                         return take(each);
                     }
                 }
-                throw unknownChoice("technology", text, names);
+                throw unknownChoice(name, text, names);
             },
             description)
         ->type_name(names);

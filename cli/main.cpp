@@ -2,7 +2,6 @@
 #include "cli/Output.h"
 #include "cli/Programs.h"
 #include "telephony/ChildService.h"
-#include "telephony/simulator/SimulatedRecording.h"
 
 #include <csignal>
 #include <cstdio>
@@ -25,19 +24,13 @@ struct Run {
     ExitStatus operator()(const ServiceStatusOptions& /*options*/) const {
         return printServiceStatus() == 0 ? kExitSuccess : kExitFailure;
     }
-    ExitStatus operator()(const SimulateOptions& options) const {
-        if (const auto error = writeSimulatedRecording(options.simulation, options.file)) {
-            complain(error->sentence);
-            return kExitFailure;
-        }
-        return kExitSuccess;
-    }
+    ExitStatus operator()(const SimulateOptions& options) const { return runSimulate(options); }
     ExitStatus operator()(const ParseEnd& end) const {
-        const bool wanted = end.status == kExitSuccess;
-        Output output(writeToDescriptor(wanted ? STDOUT_FILENO : STDERR_FILENO,
-                                        wanted ? "Standard output" : "Standard error"));
-        output.text() = end.text;
-        output.flush();
+        if (end.status == kExitSuccess) {
+            writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);
+        } else { // the status tells it, whether or not anybody reads why
+            (void)std::fwrite(end.text.data(), 1, end.text.size(), stderr);
+        }
         return end.status;
     }
 };

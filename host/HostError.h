@@ -7,6 +7,8 @@ namespace pallax {
 /// Why something of the host could not be had: one clear sentence for the user, without a newline.
 struct HostError {
     std::string sentence;
+    /// What was written to is a pipe that nobody reads any more: a reason to end quietly.
+    bool readerHasGone = false;
 };
 
 } // namespace pallax

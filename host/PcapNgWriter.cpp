@@ -95,7 +95,8 @@ ByteBuffer sectionHeader() {
 }
 
 HostError failureOf(std::string_view name, int error) {
-    return {formatText("The recording %@ cannot be written: %@.", {name, std::strerror(error)})};
+    return {formatText("The recording %@ cannot be written: %@.", {name, std::strerror(error)}),
+            error == EPIPE};
 }
 
 } // namespace

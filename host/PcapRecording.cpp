@@ -38,6 +38,7 @@ public:
     }
     RecordingError foreignLinkType() const override;
     std::optional<RecordedPacket> next() override;
+    std::optional<std::uint64_t> position() const override;
     const std::optional<RecordingError>& error() const override { return _error; }
 
 private:
@@ -85,6 +86,11 @@ std::optional<RecordedPacket> PcapRecording::next() {
     }
     _ended = true;
     return std::nullopt;
+}
+
+std::optional<std::uint64_t> PcapRecording::position() const {
+    const off_t position = ::ftello(pcap_file(_capture));
+    return position >= 0 ? std::optional(static_cast<std::uint64_t>(position)) : std::nullopt;
 }
 
 /// Opens the file for reading, or says why not.

@@ -5,6 +5,7 @@
 #include "platform/Result.h"
 
 #include <cstddef>
+#include <cstdint>
 #include <memory>
 #include <optional>
 #include <span>
@@ -58,6 +59,8 @@ public:
     virtual RecordingError foreignLinkType() const = 0;
     /// The next packet; nothing at the end, or when `error` has something to say.
     virtual std::optional<RecordedPacket> next() = 0;
+    /// How many bytes of the file the packets so far have taken; nothing for a pipe.
+    virtual std::optional<std::uint64_t> position() const { return std::nullopt; }
     /// Set once `next` has given nothing because the recording is cut in the middle of a packet,
     /// or cannot be read on.
     virtual const std::optional<RecordingError>& error() const = 0;

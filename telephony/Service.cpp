@@ -12,6 +12,7 @@
 #include "telephony/simulator/SimulatedSource.h"
 
 #include <array>
+#include <cerrno>
 #include <charconv>
 #include <cmath>
 #include <csignal>
@@ -199,10 +200,11 @@ int printServiceStatus() {
     const std::string text = statusText(*status);
     const bool isPrinted =
         std::fwrite(text.data(), 1, text.size(), stdout) == text.size() && std::fflush(stdout) == 0;
-    if (!isPrinted) {
-        complain("Standard output cannot be written.");
+    if (isPrinted || errno == EPIPE) { // whoever reads has seen enough
+        return 0;
     }
-    return isPrinted ? 0 : 1;
+    complain("Standard output cannot be written.");
+    return 1;
 }
 
 } // namespace pallax

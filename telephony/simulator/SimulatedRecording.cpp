@@ -6,7 +6,8 @@
 namespace pallax {
 
 std::optional<HostError> writeSimulatedRecording(const SimulationOptions& options,
-                                                 const std::string& path) {
+                                                 const std::string& path,
+                                                 const std::function<void(Time time)>& written) {
     auto writer = RecordingWriter::create(path, options.technology->linkType,
                                           RecordingWriter::Flush::InBlocks);
     if (!writer) {
@@ -16,6 +17,9 @@ std::optional<HostError> writeSimulatedRecording(const SimulationOptions& option
     while (const auto packet = simulation.next()) {
         if (auto error = (*writer)->write(packet->time, packet->data)) {
             return error;
+        }
+        if (written) {
+            written(packet->time);
         }
     }
     return (*writer)->flush();

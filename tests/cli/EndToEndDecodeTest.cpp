@@ -180,8 +180,9 @@ TEST_F(EndToEnd, WrongUsageIsStatus2AndOneSentence) {
     const Run wrong = run({"decode", "--every", "day", "a.pcap"});
     EXPECT_EQ(wrong.status, 2);
     EXPECT_EQ(wrong.out, "");
-    EXPECT_EQ(wrong.err,
-              "pallax: --every: \"day\" is none of end|tick|packet (pallax --help tells more)\n");
+    EXPECT_EQ(
+        wrong.err,
+        "pallax: --every: \"day\" is none of end|tick|packet (pallax decode --help tells more)\n");
     EXPECT_EQ(run({"--version"}).status, 0);
 }
 

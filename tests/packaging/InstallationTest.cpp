@@ -112,29 +112,5 @@ TEST_F(Installation, TheTypeOfRecordingsIsTakenByTheDatabase) {
               std::string::npos);
 }
 
-TEST(Package, TheDebianPackageRunsFromWhereItIsUnpacked) {
-    if (!isInstalled("dpkg-deb") || !isInstalled("dpkg-shlibdeps")) {
-        GTEST_SKIP() << "dpkg-dev is not installed";
-    }
-    const doubles::TemporaryFolder folder;
-    const auto made = runCommand(
-        PALLAX_CPACK " --config " PALLAX_BINARY_DIR "/CPackConfig.cmake -B " + folder.path("made"));
-    ASSERT_EQ(made.status, 0) << made.out;
-    const std::string package = folder.path("made") + "/pallax_*.deb";
-    const std::string depends = runCommand("dpkg-deb -f " + package + " Depends").out;
-    for (const char* library : {"libc6 ", "libncursesw6 ", "libpcap0.8 ", "libpugixml1v5 "}) {
-        EXPECT_NE(depends.find(library), std::string::npos) << depends;
-    }
-    ASSERT_EQ(runCommand("dpkg-deb -x " + package + " " + folder.path("root")).status, 0);
-    EXPECT_NE(contentOf(folder.path("root/usr/lib/systemd/user/pallax.service"))
-                  .find("\nExecStart=/usr/bin/pallax service "),
-              std::string::npos);
-    EXPECT_TRUE(fs::exists(folder.path("root/usr/share/zsh/vendor-completions/_pallax")));
-    const auto demo = runCommand("env -u PALLAX_RESOURCES " + folder.path("root/usr/bin/pallax") +
-                                 " demo --print --seconds 4 --speed max");
-    EXPECT_EQ(demo.status, 0);
-    EXPECT_NE(demo.out.find("\nServing Cell Info\n"), std::string::npos) << demo.out;
-}
-
 } // namespace
 } // namespace pallax

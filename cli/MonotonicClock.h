@@ -1,0 +1,16 @@
+#pragma once
+
+#include "platform/Clock.h"
+
+#include <chrono>
+
+namespace pallax {
+
+/// A clock for durations: it counts from no date in particular, and nobody can set it back.
+class MonotonicClock final : public Clock {
+public:
+    Time now() const override { return Time(std::chrono::steady_clock::now().time_since_epoch()); }
+    Zone zone(Time /*time*/) const override { return {}; }
+};
+
+} // namespace pallax

@@ -1,0 +1,191 @@
+#include "cli/CommandLine.h"
+#include "cli/HelpText.h"
+#include "tests/cli/EndToEnd.h"
+
+#include <csignal>
+#include <filesystem>
+#include <fstream>
+#include <set>
+
+namespace pallax {
+namespace {
+
+using doubles::PallaxProcess;
+using std::chrono::milliseconds;
+using std::chrono::seconds;
+
+/// A command line, how it ends, and all that it says on standard error.
+struct Case {
+    std::vector<std::string> arguments;
+    int status;
+    std::string sentence;
+    std::string input = "/dev/null";
+    std::string output{};
+    std::vector<std::string> environment{};
+};
+
+/// Every command with every exit status that its help names.
+class EndToEndStatus : public EndToEnd {
+protected:
+    EndToEndStatus() {
+        std::ofstream(world.path("broken.pcap")).close();
+        std::ofstream(world.path("here.pcapng")).close();
+    }
+
+    void ends(const Case& expected) {
+        SCOPED_TRACE(testing::PrintToString(expected.arguments));
+        world.environment = expected.environment;
+        PallaxProcess process(world, expected.arguments, expected.input, expected.output);
+        EXPECT_EQ(process.wait(), expected.status);
+        EXPECT_EQ(process.err(), expected.sentence);
+        world.environment.clear();
+        const std::string& first = expected.arguments.front();
+        const bool isCommand = first.find_first_of("/.-") == std::string::npos;
+        _seen.emplace(isCommand ? first : "pallax", std::to_string(expected.status));
+    }
+
+    /// Fails for a status that a command's help names and no case has had, or the other way round.
+    void expectEveryDocumentedStatus(const std::set<std::string>& commands) const {
+        std::set<std::pair<std::string, std::string>> documented;
+        const CommandDescription program = CommandLine().description();
+        std::vector<CommandDescription> all = program.commands;
+        all.push_back(program);
+        for (const CommandDescription& command : all) {
+            for (const HelpText::Status& status : takenApart(command.footer).statuses) {
+                if (commands.contains(command.name)) {
+                    documented.emplace(command.name, status.number);
+                }
+            }
+        }
+        EXPECT_EQ(_seen, documented);
+    }
+
+    std::string fatal() const {
+        return record("fatal.pcap",
+                      {{milliseconds(0), registration(0)}, {seconds(1), unreadableSimFiles()}});
+    }
+    std::string fatalReason() const {
+        return "packet 2 (log code 0xFF0000): the embedded property list cannot be parsed\n";
+    }
+    std::string sample = PALLAX_SOURCE_DIR "/samples/gsm-attach.pcap";
+    std::string missing = world.path("missing.pcap");
+    std::string isMissing =
+        "pallax: " + missing + " cannot be opened: No such file or directory.\n";
+
+private:
+    std::set<std::pair<std::string, std::string>> _seen;
+};
+
+TEST_F(EndToEndStatus, OfBrowsing) {
+    const std::string path = fatal();
+    ends({{sample, "--print", "--speed", "max"}, 0, ""});
+    ends({{missing, "--print"}, 1, isMissing});
+    ends({{world.path("broken.pcap"), "--print"},
+          1,
+          "pallax: " + world.path("broken.pcap") + " is empty.\n"});
+    ends({{"--speed", "0", sample},
+          2,
+          "pallax: --speed: \"0\" is neither a number above 0 nor max (pallax --help tells "
+          "more)\n"});
+    ends({{path, "--print", "--speed", "max"}, 70, "pallax: " + fatalReason()});
+    ends({{path, "--print", "--speed", "max", "--keep-going"}, 0, ""});
+    expectEveryDocumentedStatus({"pallax"});
+}
+
+TEST_F(EndToEndStatus, OfDecode) {
+    const std::string path = fatal();
+    ends({{"decode", sample}, 0, ""});
+    ends({{"decode", path}, 0, "pallax: " + path + ": " + fatalReason()});
+    ends({{"decode", missing, sample}, 1, isMissing});
+    ends({{"decode", sample},
+          1,
+          "pallax: Standard output cannot be written: No space left on device.\n",
+          "/dev/null",
+          "/dev/full"});
+    ends({{"decode"}, 2, "pallax: RECORDING is required (pallax decode --help tells more)\n"});
+    ends({{"decode", "--strict", path}, 70, "pallax: " + path + ": " + fatalReason()});
+    expectEveryDocumentedStatus({"decode"});
+}
+
+TEST_F(EndToEndStatus, OfRecord) {
+    PallaxProcess service(world, {"service", "--play", sample, "--speed", "max"});
+    ASSERT_TRUE(doubles::eventually([this] { return !world.sockets().empty(); }));
+    const std::string taken = world.path("here.pcapng");
+    ends({{"record", world.path("new.pcapng")}, 0, ""});
+    ends(
+        {{"record", taken}, 1, "pallax: " + taken + " exists already; --overwrite replaces it.\n"});
+    ends({{"record", "--technology", "lte", world.path("other.pcapng")},
+          1,
+          "pallax: The modem's technology is Zorell_GSM (gsm), not lte.\n"});
+    ends({{"record"}, 2, "pallax: FILE is required (pallax record --help tells more)\n"});
+    expectEveryDocumentedStatus({"record"});
+    service.signal(SIGTERM);
+    EXPECT_EQ(service.wait(), 0);
+}
+
+TEST_F(EndToEndStatus, OfService) {
+    ends({{"service", "--relay", "-"},
+          0,
+          "pallax: The stream has ended. 51 packets were relayed.\n",
+          sample});
+    ends({{"service", "--play", missing}, 1, isMissing});
+    ends({{"service", "--status"}, 1, "pallax: No telephony service is running.\n"});
+    ends({{"service"},
+          2,
+          "pallax: the service needs --play, --simulate, --relay or --status (pallax service "
+          "--help tells more)\n"});
+    expectEveryDocumentedStatus({"service"});
+}
+
+TEST_F(EndToEndStatus, OfDemo) {
+    const std::string nowhere = world.path("missing");
+    ends({{"demo", "--print", "--seconds", "2", "--speed", "max"}, 0, ""});
+    ends({{"demo", "--print"},
+          1,
+          "pallax: The folder for message ports, " + nowhere +
+              "/pallax, cannot be made: No such file or directory.\n",
+          "/dev/null",
+          "",
+          {"XDG_RUNTIME_DIR=" + nowhere}});
+    ends({{"demo", "ltr"},
+          2,
+          "pallax: TECHNOLOGY: \"ltr\" is none of ifx|gsm|cdma|lte|utran. Did you mean \"lte\"? "
+          "(pallax demo --help tells more)\n"});
+    expectEveryDocumentedStatus({"demo"});
+}
+
+TEST_F(EndToEndStatus, OfSimulate) {
+    ends({{"simulate", "lte", "--seconds", "2", "-o", world.path("new.pcap")}, 0, ""});
+    ends({{"simulate", "lte", "--seconds", "2", "-o", "/dev/full"},
+          1,
+          "pallax: The recording /dev/full cannot be written: No space left on device.\n"});
+    ends({{"simulate", "lte", "-o", world.path("new.pcap")},
+          2,
+          "pallax: --seconds is required (pallax simulate --help tells more)\n"});
+    expectEveryDocumentedStatus({"simulate"});
+}
+
+TEST_F(EndToEndStatus, OfTheTextsForPackages) {
+    const std::string full =
+        "pallax: Standard output cannot be written: No space left on device.\n";
+    ends({{"completion", "bash"}, 0, ""});
+    ends({{"completion", "bash"}, 1, full, "/dev/null", "/dev/full"});
+    ends({{"completion"}, 2, "pallax: SHELL is required (pallax completion --help tells more)\n"});
+    ends({{"manual", "pallax"}, 0, ""});
+    ends({{"manual", "pallax"}, 1, full, "/dev/null", "/dev/full"});
+    ends({{"manual"}, 2, "pallax: PAGE is required (pallax manual --help tells more)\n"});
+}
+
+TEST_F(EndToEndStatus, WithoutDisplayTemplatesIsFailure) {
+    const std::string sentence = "pallax: There are no display templates in /nonexistent; "
+                                 "PALLAX_RESOURCES names their folder.\n";
+    for (const std::vector<std::string>& arguments : {std::vector<std::string>{"decode", sample},
+                                                      {sample, "--print"},
+                                                      {"demo", "--print"},
+                                                      {"record", world.path("new.pcapng")}}) {
+        ends({arguments, 1, sentence, "/dev/null", "", {"PALLAX_RESOURCES=/nonexistent"}});
+    }
+}
+
+} // namespace
+} // namespace pallax
