@@ -1,6 +1,7 @@
 #include "LogGenerator/C2K/ForwardDataRate.h"
 
 #include "LogGenerator/C2K/DataRate.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -56,6 +57,13 @@ void parseForwardDataRate(const LogRecord& packet, Dictionary& state, const Dict
         return;
     }
     updateDataRate(kNames, packet.u32(kSequence), totalOf(packet), state, lookup);
+}
+
+CodeDescription describeForwardDataRate(LogCode logCode) {
+    CodeDescription code{logCode, kMinimumLength};
+    code.fields = {
+        describeDataRate(kNames, u32At(kSequence), {kCounters, kWeights.size() * kCounterLength})};
+    return code;
 }
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/C2K/ReverseDataRate.h"
 
 #include "LogGenerator/C2K/DataRate.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -60,6 +61,12 @@ void parseReverseDataRate(const LogRecord& packet, Dictionary& state, const Dict
         return;
     }
     updateDataRate(kNames, packet.u32(kSequence), totalOf(packet), state, lookup);
+}
+
+CodeDescription describeReverseDataRate(LogCode logCode) {
+    CodeDescription code{logCode, kMinimumLength};
+    code.fields = {describeDataRate(kNames, u32At(kSequence), {kCounters, kBlocks * kBlockLength})};
+    return code;
 }
 
 } // namespace pallax

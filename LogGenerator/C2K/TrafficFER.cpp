@@ -52,4 +52,16 @@ PropertyList shownOldTrafficFER(float rate) {
     return DisplayNumber(double{percent(rate)}, kOldPercent);
 }
 
+FieldDescription describeTrafficFER(std::size_t frameInError) {
+    return describeComputed(kTrafficFERName, kPercent,
+                            "a frame is in error unless the byte is 0; of the call's frames so far "
+                            "the average in which the newest has a weight of 1/64",
+                            {{frameInError}});
+}
+
+FieldDescription describeOldTrafficFER() {
+    return describeComputed(kTrafficFERName, kOldPercent,
+                            "outside Traffic, once: the average of the call that is over", {});
+}
+
 } // namespace pallax
