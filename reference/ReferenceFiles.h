@@ -13,8 +13,8 @@ struct ReferenceFile {
     std::string text;
 };
 
-/// All of them. `resources` holds the templates; `dissector` is the dissector's part that is
-/// written by hand (dissector.lua beside this file).
-std::vector<ReferenceFile> referenceFiles(const Resources& resources, const std::string& dissector);
+/// All of them. `resources` holds the templates; `program` is the
+/// part of the dissector that is written by hand (dissector.lua beside this file).
+std::vector<ReferenceFile> referenceFiles(const Resources& resources, const std::string& program);
 
 } // namespace pallax

@@ -24,8 +24,8 @@ ListDescription describePilots(std::string_view lookupName, const EntryList::Lay
     ListDescription list = describeList(lookupName, layout, count, {});
     list.entryName = name;
     list.ifEmpty = PilotList::kNone;
-    list.fields = {
-        describeComputed("", kSignedLevelDb, "10 x log10(raw / 512)", {extentOf(energy)})};
+    list.fields = {describeComputed("", kSignedLevelDb, "energy", "10 x log10(raw / 512)",
+                                    {extentOf(energy)})};
     return list;
 }
 

@@ -27,8 +27,8 @@ struct DataRateNames {
 void updateDataRate(const DataRateNames& names, std::uint32_t sequence, std::int64_t sent,
                     Dictionary& state, const Dictionary& lookup);
 
-/// A rate that is shown so: the packet's sequence number, and the bytes of its counters.
+/// A rate that is shown so: the packet's sequence number, and its counters with the bytes of all.
 FieldDescription describeDataRate(const DataRateNames& names, const Position& sequence,
-                                  const Extent& counters);
+                                  const Extent& bytes, std::vector<Counter> counters);
 
 } // namespace pallax

@@ -60,9 +60,16 @@ void parseForwardDataRate(const LogRecord& packet, Dictionary& state, const Dict
 }
 
 CodeDescription describeForwardDataRate(LogCode logCode) {
+    std::vector<Counter> counters;
+    for (std::size_t counter = 0; counter < kWeights.size(); ++counter) {
+        if (kWeights[counter] != 0) {
+            counters.push_back({kCounters + counter * kCounterLength, kWeights[counter]});
+        }
+    }
     CodeDescription code{logCode, kMinimumLength};
-    code.fields = {
-        describeDataRate(kNames, u32At(kSequence), {kCounters, kWeights.size() * kCounterLength})};
+    code.fields = {describeDataRate(kNames, u32At(kSequence),
+                                    {kCounters, kWeights.size() * kCounterLength},
+                                    std::move(counters))};
     return code;
 }
 

@@ -173,7 +173,7 @@ CodeDescription describeOneXStatus(LogCode logCode) {
     SubpacketDescription systemState{
         kSystemStateId,
         {describeLabel("k1xDeviceState", u8At(kDeviceState), kOneXDeviceStates),
-         describeOldTrafficFER()}};
+         describeOldTrafficFER(kDeviceState)}};
     SubpacketDescription radio{
         kRadioId,
         {
@@ -192,7 +192,7 @@ CodeDescription describeOneXStatus(LogCode logCode) {
     pilots.formula = "a pilot is 6m + 12 bytes, up to a multiple of 4, m being the byte at 9; the "
                      "first one begins with the subpacket";
     pilots.fields = {describeComputed(
-        "", kSignedLevelDb,
+        "", kSignedLevelDb, "scaled energy",
         "10 x log10 of 2^(2e - 3) x E / (9 x N^2 x g) - 1 / N, at least 0.00001: E, 16 bits, at "
         "4m + 24 of the pilot, N, g and e of the subpacket",
         {{kEnergyDivisor, sizeof(std::uint16_t)},

@@ -53,15 +53,16 @@ PropertyList shownOldTrafficFER(float rate) {
 }
 
 FieldDescription describeTrafficFER(std::size_t frameInError) {
-    return describeComputed(kTrafficFERName, kPercent,
+    return describeComputed(kTrafficFERName, kPercent, "frame errors",
                             "a frame is in error unless the byte is 0; of the call's frames so far "
                             "the average in which the newest has a weight of 1/64",
                             {{frameInError}});
 }
 
-FieldDescription describeOldTrafficFER() {
-    return describeComputed(kTrafficFERName, kOldPercent,
-                            "outside Traffic, once: the average of the call that is over", {});
+FieldDescription describeOldTrafficFER(std::size_t deviceState) {
+    return describeComputed(kTrafficFERName, kOldPercent, "old frame errors",
+                            "outside Traffic, once: the average of the call that is over",
+                            {{deviceState}});
 }
 
 } // namespace pallax

@@ -29,7 +29,7 @@ PropertyList shownOldTrafficFER(float rate);
 
 /// The rate that is shown where the byte at `frameInError` tells of a frame: an error unless 0.
 FieldDescription describeTrafficFER(std::size_t frameInError);
-/// The rate of a call that is over.
-FieldDescription describeOldTrafficFER();
+/// The rate of a call that is over, as the device state at that byte tells.
+FieldDescription describeOldTrafficFER(std::size_t deviceState);
 
 } // namespace pallax

@@ -8,10 +8,12 @@ Extent extentOf(const Position& position, Extent::Origin origin) {
 }
 
 FieldDescription describeComputed(std::string_view key, const NumberFormat& format,
-                                  std::string_view formula, std::vector<Extent> read) {
+                                  std::string_view computation, std::string_view formula,
+                                  std::vector<Extent> read) {
     FieldDescription field{std::string(key)};
     field.shownAs.format = &format;
     field.formula = formula;
+    field.computation = computation;
     field.read = std::move(read);
     return field;
 }

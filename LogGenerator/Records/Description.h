@@ -33,6 +33,12 @@ struct Extent {
     Origin origin = Origin::Here;
 };
 
+/// A 32-bit counter that counts with a weight.
+struct Counter {
+    std::size_t byte;
+    std::uint32_t weight;
+};
+
 /// Something holds only while a number lies from `least` to `most`.
 struct Condition {
     Position position;
@@ -53,7 +59,10 @@ struct FieldDescription {
     ShownAs shownAs = {};
     std::string_view listKey = {}; ///< under which the property list holds the value
     std::string_view formula = {}; ///< how a computed value is made of the bytes in `read`
-    std::vector<Extent> read = {}; ///< what is computed of
+    /// What the formula is called, for those who compute it elsewhere.
+    std::string_view computation = {};
+    std::vector<Extent> read = {};      ///< what is computed of
+    std::vector<Counter> counters = {}; ///< the counters among that, where there are some
     std::optional<Condition> condition = std::nullopt;
 };
 
@@ -103,6 +112,8 @@ struct ListDescription {
     /// Entries that lie as no run does: how they lie. The layout is then none.
     std::string_view formula = {};
     bool isShown = true; ///< false: read, and kept from the display
+    /// Of a list that is remembered for other records, its second field by its first: as what.
+    std::string_view rememberedAs = {};
 };
 
 struct SubpacketDescription {
@@ -139,7 +150,8 @@ FieldDescription describeField(const Field& field);
 std::vector<FieldDescription> describeFields(std::span<const Field> fields);
 /// A value that is computed of `read`, as the formula says, and shown under `format`.
 FieldDescription describeComputed(std::string_view key, const NumberFormat& format,
-                                  std::string_view formula, std::vector<Extent> read);
+                                  std::string_view computation, std::string_view formula,
+                                  std::vector<Extent> read);
 /// What `showGroup` shows.
 RecordDescription describeGroups(std::span<const FieldGroup> groups);
 /// A list whose entries are dictionaries of `fields`; the number of entries stands at `count`.

@@ -79,11 +79,11 @@ RecordDescription ActiveSet::describe() const {
     list.companion = EntryRun{{kCellsStart, kPathLength, kPathLength},
                               EntryRun::Move{kCellStride, u8At(kCellCountOffset)}};
     list.fields.push_back(describeComputed(
-        "RSCP", kDecimalDb,
+        "RSCP", kDecimalDb, "rscp",
         "(A + 512) / 10 toward zero - 106 + Energy Per Chip, A being the receive AGC, signed",
         std::move(energiesAndAgc)));
     list.fields.push_back(describeComputed(
-        "Energy Per Chip", kDecimalDb,
+        "Energy Per Chip", kDecimalDb, "ecno",
         "whole dB of the first of the three energies of the cell's path that is not 0",
         std::move(energies)));
 

@@ -55,7 +55,8 @@ void EquivalentPLMNList::updateWithData(const LogRecord& record, LogCode logCode
 
 RecordDescription EquivalentPLMNList::describe() const {
     const auto digits = [](std::string_view key, std::size_t first) {
-        return describeComputed(key, kDecimal, "100 x the first byte + 10 x the second + the third",
+        return describeComputed(key, kDecimal, "digits",
+                                "100 x the first byte + 10 x the second + the third",
                                 {{first}, {first + 2}, {first + 4}});
     };
     ListDescription list = describeList("", kEntries, u8At(kCountOffset), {});

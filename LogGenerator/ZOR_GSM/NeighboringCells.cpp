@@ -114,9 +114,10 @@ void NeighboringCells::showMonitoredCells(const LogRecord& record) {
 RecordDescription NeighboringCells::describe() const {
     ListDescription neighbours =
         describeList("", kNeighbours, u8At(kNeighbourCountOffset), kNeighbourFields);
-    neighbours.fields.push_back(describeComputed(
-        kBSICKey, kDecimal, "what the last record 0x51FF told for the ARFCN; no key if nothing",
-        {extentOf(u16At(kArfcnInEntry))}));
+    neighbours.fields.push_back(
+        describeComputed(kBSICKey, kDecimal, "bsic",
+                         "what the last record 0x51FF told for the ARFCN; no key if nothing",
+                         {extentOf(u16At(kArfcnInEntry))}));
     CodeDescription measured{kMeasurementLogCode, kMeasurementLength};
     measured.lists = {std::move(neighbours)};
 
@@ -127,6 +128,7 @@ RecordDescription NeighboringCells::describe() const {
     CodeDescription bsics{kBsicListLogCode, kBsicListMinimumLength};
     bsics.lists = {describeList("", kBsics, u8At(kBsicCountOffset), told)};
     bsics.lists.front().isShown = false;
+    bsics.lists.front().rememberedAs = "bsic";
     bsics.note = "Remembered for the lists to come; shows nothing itself.";
 
     CodeDescription monitored = describeCells("each neighbour of GSM", kCellNumbers, kCellLevels);

@@ -125,23 +125,24 @@ void ServingPLMN::showServingCell(const LogRecord& record) {
 
 RecordDescription ServingPLMN::describe() const {
     CodeDescription network{kServingPLMNLogCode, kServingPLMNLength};
-    const auto digits = [](std::string_view key, std::string_view formula, std::size_t byte,
-                           std::size_t other) {
+    const auto digits = [](std::string_view key, std::string_view computation,
+                           std::string_view formula, std::vector<Extent> read) {
         FieldDescription field{std::string(key)};
         field.formula = formula;
-        field.read = {{byte}, {other}};
+        field.computation = computation;
+        field.read = std::move(read);
         return field;
     };
     network.fields = {
-        digits(kCountryCodeKey,
+        digits(kCountryCodeKey, "country code",
                "three digits: low and high half of the first byte, low half of the second; a blank "
                "for one above 9",
-               kFirstDigits, kSecondDigits),
+               {{kFirstDigits}, {kSecondDigits}}),
         digits(
-            kNetworkCodeKey,
+            kNetworkCodeKey, "network code",
             "three digits: low and high half of the first byte, high half of the second; a blank "
             "for one above 9",
-            kThirdDigits, kSecondDigits)};
+            {{kThirdDigits}, {kSecondDigits}})};
     for (FieldDescription& field : describeFields(kNetworkFields)) {
         network.fields.push_back(std::move(field));
     }

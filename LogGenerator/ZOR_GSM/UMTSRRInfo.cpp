@@ -159,7 +159,7 @@ RecordDescription UMTSRRInfo::describe() const {
     state.fields = describeFields(kStateFields);
 
     CodeDescription power{kTransmitPowerLogCode, kTransmitPowerRecordLength};
-    power.fields = {describeComputed(kTransmitPowerKey, kMeanDbm,
+    power.fields = {describeComputed(kTransmitPowerKey, kMeanDbm, "mean power",
                                      "the mean of (v + 512) / 10 toward zero - 70 over the entries "
                                      "whose raw power v is not 0; of none, it is no number",
                                      {{kPowerCountOffset}})};
