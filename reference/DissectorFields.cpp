@@ -195,6 +195,9 @@ std::string luaLayout(const ListDescription& list) {
     if (!list.formula.empty()) {
         table.truth("varying", true);
     }
+    if (list.staysWithoutEntries) {
+        table.truth("stays_without_entries", true);
+    }
     if (!list.isShown) {
         table.truth("hidden", true);
     }

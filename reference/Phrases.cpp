@@ -241,6 +241,7 @@ std::string layoutOf(const ListDescription& list) {
     if (!list.ifEmpty.empty()) {
         text += " Without entries " + quoted(list.ifEmpty) + ".";
     }
+    text += list.staysWithoutEntries ? " Without entries the list stays as it was." : "";
     return text + (list.isShown ? "" : " They are not shown.");
 }
 

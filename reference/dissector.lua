@@ -404,7 +404,7 @@ local function add_list(context, tree, list)
     return add_varying(context, tree:add(range_of(context.record, context.start, 1), layout.key), list)
   end
   local count = entry_count(context, layout)
-  if not fits(context, layout, count) then return end
+  if not fits(context, layout, count) or layout.stays_without_entries and count == 0 then return end
   if layout.remembered_as then remember(context, list, count) end
   local range = range_of(context.record, run_start(context, layout), count * layout.stride)
   if layout.hidden then

@@ -111,6 +111,8 @@ struct ListDescription {
     std::string_view ifEmpty = {};                    ///< shown for a list without entries
     /// Entries that lie as no run does: how they lie. The layout is then none.
     std::string_view formula = {};
+    /// A record that tells of no entry leaves the list as it was.
+    bool staysWithoutEntries = false;
     bool isShown = true; ///< false: read, and kept from the display
     /// Of a list that is remembered for other records, its second field by its first: as what.
     std::string_view rememberedAs = {};

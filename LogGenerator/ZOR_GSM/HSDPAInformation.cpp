@@ -77,14 +77,16 @@ void HSDPAInformation::updateWithData(const LogRecord& record, LogCode logCode) 
 
 RecordDescription HSDPAInformation::describe() const {
     const EntryList::Layout processes{kProcessesStart, kProcessLength, kProcessLength};
+    ListDescription primary =
+        describeList(kPrimaryKey, processes, u8At(kPrimaryCountOffset), kProcessFields);
+    primary.staysWithoutEntries = true;
     ListDescription secondary =
         describeList(kSecondaryKey, processes, u8At(kSecondaryCountOffset), kProcessFields);
+    secondary.staysWithoutEntries = true;
     secondary.entries.move = EntryRun::Move{kPrimaryStride, u8At(kPrimaryCountOffset)};
     CodeDescription code{kHarqLogCode, kMinimumLength};
     code.fields = describeFields(kFields);
-    code.lists = {describeList(kPrimaryKey, processes, u8At(kPrimaryCountOffset), kProcessFields),
-                  std::move(secondary)};
-    code.note = "A list of which the record claims no entry stays as it was.";
+    code.lists = {std::move(primary), std::move(secondary)};
     return {std::move(code)};
 }
 

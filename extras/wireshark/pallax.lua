@@ -154,7 +154,7 @@ local technologies = {
           },
           lists = {
             {
-              layout = { key = "Primary HARQ Process", start = 18, stride = 9, bytes_read = 9, count = { byte = 16, bit = 0, width = 8 }, plus = 0 },
+              layout = { key = "Primary HARQ Process", start = 18, stride = 9, bytes_read = 9, count = { byte = 16, bit = 0, width = 8 }, plus = 0, stays_without_entries = true },
               fields = {
                 { key = "Process ID", filter = "hsdpa_info.primary_harq_process.process_id", position = { byte = 0, bit = 0, width = 8 }, format = { number = "%d", unsigned = true } },
                 { key = "No Rx Bits", filter = "hsdpa_info.primary_harq_process.no_rx_bits", position = { byte = 1, bit = 0, width = 32 }, format = { number = "%d", unsigned = true } },
@@ -163,7 +163,7 @@ local technologies = {
               },
             },
             {
-              layout = { key = "Secondary HARQ Process", start = 18, stride = 9, bytes_read = 9, move = 162, moved_by = { byte = 16, bit = 0, width = 8 }, count = { byte = 17, bit = 0, width = 8 }, plus = 0 },
+              layout = { key = "Secondary HARQ Process", start = 18, stride = 9, bytes_read = 9, move = 162, moved_by = { byte = 16, bit = 0, width = 8 }, count = { byte = 17, bit = 0, width = 8 }, plus = 0, stays_without_entries = true },
               fields = {
                 { key = "Process ID", filter = "hsdpa_info.secondary_harq_process.process_id", position = { byte = 0, bit = 0, width = 8 }, format = { number = "%d", unsigned = true } },
                 { key = "No Rx Bits", filter = "hsdpa_info.secondary_harq_process.no_rx_bits", position = { byte = 1, bit = 0, width = 32 }, format = { number = "%d", unsigned = true } },
@@ -1387,7 +1387,7 @@ local function add_list(context, tree, list)
     return add_varying(context, tree:add(range_of(context.record, context.start, 1), layout.key), list)
   end
   local count = entry_count(context, layout)
-  if not fits(context, layout, count) then return end
+  if not fits(context, layout, count) or layout.stays_without_entries and count == 0 then return end
   if layout.remembered_as then remember(context, list, count) end
   local range = range_of(context.record, run_start(context, layout), count * layout.stride)
   if layout.hidden then
