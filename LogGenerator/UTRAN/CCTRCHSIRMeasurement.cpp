@@ -24,7 +24,7 @@ PropertyList channelOf(const LogRecord& entry) {
     showFields(channel, kFields, entry);
     const EntryList ratios(entry, kRatios, kRatioCount);
     channel.setFixed(kRatiosKey, ratios.map([](const LogRecord& ratio, std::size_t /*index*/) {
-        return DisplayNumber(ratio.read(kRatio), kDecimal);
+        return DisplayNumber(std::int64_t{ratio.u8(kRatio.byte)}, kDecimal);
     }));
     return channel;
 }

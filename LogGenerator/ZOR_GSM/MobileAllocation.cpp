@@ -38,7 +38,7 @@ void MobileAllocation::updateWithData(const LogRecord& record, LogCode logCode) 
     show(kFields, record);
     const EntryList channels(record, kChannels, record.u8(kCountOffset));
     show(kChannelsKey, channels.map([](const LogRecord& channel, std::size_t) {
-        return DisplayNumber(channel.read(kChannelNumber), kDecimal);
+        return DisplayNumber(std::int64_t{channel.u16(kChannelNumber.byte)}, kDecimal);
     }));
 }
 
