@@ -156,7 +156,7 @@ std::string seeAlso(const CommandDescription& program, const CommandDescription*
             list += ".BR pallax\\-" + each.name + " (1),\n";
         }
     }
-    return list + ".BR pallax.conf (5),\n.BR pallax\\-recording (7)\n";
+    return list + ".BR pallax.conf (5),\n.BR pallax\\-recording (7),\n.BR pallax\\-sections (7)\n";
 }
 
 /// "Pallax shows that." as "shows that", for it stands behind the name.

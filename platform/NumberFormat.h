@@ -106,6 +106,9 @@ public:
     constexpr bool isReal() const { return _conversion.conversion == 'f'; }
     constexpr std::string_view unit() const { return _unit; }
     constexpr const NumberConversion& conversion() const { return _conversion; }
+    /// What stands before and behind the number, as in the format: "%%" is one per cent sign.
+    constexpr std::string_view prefix() const { return _prefix; }
+    constexpr std::string_view suffix() const { return _suffix; }
 
     void append(std::string& out, std::int64_t number) const;
     void append(std::string& out, double number) const;

@@ -3,6 +3,8 @@
 #include "LogGenerator/Records/Formats.h"
 #include "platform/PropertyList.h"
 
+#include <string_view>
+
 /// The formats that several parsers share.
 namespace pallax {
 
@@ -10,8 +12,9 @@ inline constexpr NumberFormat kSignedLevelDb{"%+.2f dB"};
 inline constexpr NumberFormat kSignedLevelDbm{"%+.2f dBm"};
 
 /// Shown for what the phone measures only while it transmits.
+inline constexpr std::string_view kNotAvailable = "N/A";
 inline PropertyList notAvailable() {
-    return Text::fixed("N/A");
+    return Text::fixed(kNotAvailable);
 }
 
 } // namespace pallax

@@ -10,6 +10,7 @@
 #include "LogGenerator/C2K/OneXTrafficErrors.h"
 #include "LogGenerator/C2K/ReverseDataRate.h"
 #include "LogGenerator/LogPacket.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/Resources.h"
 #include "platform/SystemLog.h"
 
@@ -24,18 +25,19 @@ namespace {
 struct Parser {
     LogCode logCode;
     void (*parse)(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+    CodeDescription (*describe)(LogCode logCode);
 };
 
 /// In the order in which the start command names the codes.
 constexpr auto kParsers = std::to_array<Parser>({
-    {0x108A, parseFingerC2I},
-    {0x1183, parseEVDOStatus},
-    {0x1192, parseForwardDataRate},
-    {0x12B6, parseEVDOActiveSet},
-    {0x119C, parseOneXStatus},
-    {0x119D, parseOneXTrafficErrors},
-    {0x127E, parseReverseDataRate},
-    {0x134F, parseOneXSystemIdentity},
+    {0x108A, parseFingerC2I, describeFingerC2I},
+    {0x1183, parseEVDOStatus, describeEVDOStatus},
+    {0x1192, parseForwardDataRate, describeForwardDataRate},
+    {0x12B6, parseEVDOActiveSet, describeEVDOActiveSet},
+    {0x119C, parseOneXStatus, describeOneXStatus},
+    {0x119D, parseOneXTrafficErrors, describeOneXTrafficErrors},
+    {0x127E, parseReverseDataRate, describeReverseDataRate},
+    {0x134F, parseOneXSystemIdentity, describeOneXSystemIdentity},
 });
 
 constexpr std::string_view kSorted = "_sorted";
@@ -137,6 +139,14 @@ PropertyList C2KLogGenerator::generateLogUsingState(Dictionary& state) {
     handOverCapture(state);
     updateHistoryInState(state, environment().clock);
     return display;
+}
+
+std::vector<CodeDescription> C2KLogGenerator::describe() {
+    std::vector<CodeDescription> description;
+    for (const Parser& parser : kParsers) {
+        description.push_back(parser.describe(parser.logCode));
+    }
+    return description;
 }
 
 } // namespace pallax

@@ -4,8 +4,11 @@
 #include "LogGenerator/ZORLogGenerator.h"
 
 #include <memory>
+#include <vector>
 
 namespace pallax {
+
+struct CodeDescription;
 
 /// The generator of the CDMA technology, 1x and EV-DO. It has no records with sections of their
 /// own: the parser of a log code stores each value under a lookup name, and the template
@@ -36,6 +39,9 @@ public:
     /// whether or not its parser accepts it; nothing else is captured. A wrong log type is
     /// reported, but does not stop the packet.
     void updateFromLog(Bytes packet, const Dictionary& lookup, Dictionary& state);
+
+    /// What the parsers read and show, out of the constants that they read with (Description.h).
+    static std::vector<CodeDescription> describe();
 };
 
 } // namespace pallax

@@ -56,4 +56,15 @@ void updateDataRate(const DataRateNames& names, std::uint32_t sequence, std::int
     setExtraInfo(state, names.sequenceNow, sequence, names.sentNow, sent);
 }
 
+FieldDescription describeDataRate(const DataRateNames& names, const Position& sequence,
+                                  const Extent& bytes, std::vector<Counter> counters) {
+    FieldDescription field =
+        describeComputed(names.rate, kRate, "data rate",
+                         "by how much the weighted sum of the counters has grown since the packet "
+                         "before, by 1024 steps of the sequence number",
+                         {extentOf(sequence), bytes});
+    field.counters = std::move(counters);
+    return field;
+}
+
 } // namespace pallax

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/Records/Description.h"
 #include "platform/PropertyList.h"
 
 #include <cstdint>
@@ -25,5 +26,9 @@ struct DataRateNames {
 /// first packet. Then keeps the new values.
 void updateDataRate(const DataRateNames& names, std::uint32_t sequence, std::int64_t sent,
                     Dictionary& state, const Dictionary& lookup);
+
+/// A rate that is shown so: the packet's sequence number, and its counters with the bytes of all.
+FieldDescription describeDataRate(const DataRateNames& names, const Position& sequence,
+                                  const Extent& bytes, std::vector<Counter> counters);
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/C2K/EVDOActiveSet.h"
 
+#include "LogGenerator/C2K/C2KDescription.h"
 #include "LogGenerator/C2K/C2KFormats.h"
 #include "LogGenerator/C2K/C2KLookup.h"
 #include "LogGenerator/C2K/PilotList.h"
@@ -39,6 +40,14 @@ void parseEVDOActiveSet(const LogRecord& packet, Dictionary& /*state*/, const Di
                    DisplayNumber(energyInDb(pilot.u16(kEnergy)), kSignedLevelDb));
     }
     setLookupValue("kActiveSetPilots", pilots.listOrNone(), lookup);
+}
+
+CodeDescription describeEVDOActiveSet(LogCode logCode) {
+    CodeDescription code{logCode, kPilots};
+    code.lists = {describePilots("kActiveSetPilots", {kPilots, kPilotLength, kPilotLength},
+                                 u8At(kPilotCount), u16At(kPN), u16At(kEnergy))};
+    code.lists.front().fit = ListDescription::Fit::AllOrNothing;
+    return code;
 }
 
 } // namespace pallax

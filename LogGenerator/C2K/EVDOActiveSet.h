@@ -1,9 +1,12 @@
 #pragma once
 
+#include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/PropertyList.h"
 
 namespace pallax {
+
+struct CodeDescription;
 
 /// The pilots of the EV-DO active set and their energies.
 ///
@@ -16,5 +19,8 @@ namespace pallax {
 ///   0     16     PN offset
 ///   2     16     energy: 10 x log10(raw / 512), dB
 void parseEVDOActiveSet(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+/// What that reads and shows, under the log code `logCode`.
+CodeDescription describeEVDOActiveSet(LogCode logCode);
 
 } // namespace pallax

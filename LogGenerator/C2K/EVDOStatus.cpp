@@ -1,5 +1,6 @@
 #include "LogGenerator/C2K/EVDOStatus.h"
 
+#include "LogGenerator/C2K/C2KDescription.h"
 #include "LogGenerator/C2K/C2KFormats.h"
 #include "LogGenerator/C2K/C2KLabels.h"
 #include "LogGenerator/C2K/C2KLookup.h"
@@ -25,6 +26,7 @@ constexpr Position kColorCode = u8At(41);
 /// The first state in which the phone transmits.
 constexpr std::uint8_t kAccess = 4;
 constexpr std::uint16_t kInvalidPN = 0xFFFF;
+constexpr std::string_view kInvalidPNText = "Invalid Value";
 
 constexpr NumberFormat kSignedDbm{"%+d dBm"};
 constexpr NumberFormat kChips{"%d × 64chips", "64chips"};
@@ -32,7 +34,7 @@ constexpr NumberFormat kSixHexadecimalDigits{"0x%06x"};
 
 PropertyList pnOffset(std::uint16_t offset) {
     if (offset == kInvalidPN) {
-        return Text::fixed("Invalid Value");
+        return Text::fixed(kInvalidPNText);
     }
     return DisplayNumber(std::int64_t{offset}, kChips);
 }
@@ -63,6 +65,33 @@ void parseEVDOStatus(const LogRecord& packet, Dictionary& /*state*/, const Dicti
     setLookupValue("kSessionState", kEVDOSessionStates.valueOf(packet.u8(kSessionState)), lookup);
     setLookupValue("kUATI24", number(kUATI24, kSixHexadecimalDigits), lookup);
     setLookupValue("kColorCode", number(kColorCode, kDecimal), lookup);
+}
+
+CodeDescription describeEVDOStatus(LogCode logCode) {
+    constexpr std::int64_t kLargestState = UINT8_MAX;
+    const auto whileTransmitting = [](FieldDescription field) {
+        field.condition = Condition{u8At(kDeviceState), kAccess, kLargestState, kNotAvailable};
+        return field;
+    };
+    FieldDescription pnOffset = describeNumber("kServingPNOffset", u16At(kServingPNOffset), kChips);
+    pnOffset.shownAs.exceptional = kInvalidPN;
+    pnOffset.shownAs.exceptionalText = kInvalidPNText;
+
+    CodeDescription code{logCode, kLength};
+    code.exactLength = true;
+    code.fields = {
+        describeNumber("kChannel", kChannel, kDecimal),
+        describeLabel("k1xEVDODeviceState", u8At(kDeviceState), kEVDODeviceStates),
+        describeLabel("kBandClass", kBandClass, kBandClasses),
+        describeNumber("kRxAGC0", kRxAGC0, kSignedDbm),
+        whileTransmitting(describeNumber("kRxAGC1", kRxAGC1, kSignedDbm)),
+        whileTransmitting(describeNumber("kTxAGC", kTxAGC, kSignedDbm)),
+        std::move(pnOffset),
+        describeLabel("kSessionState", u8At(kSessionState), kEVDOSessionStates),
+        describeNumber("kUATI24", kUATI24, kSixHexadecimalDigits),
+        describeNumber("kColorCode", kColorCode, kDecimal),
+    };
+    return code;
 }
 
 } // namespace pallax

@@ -1,9 +1,12 @@
 #pragma once
 
+#include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/PropertyList.h"
 
 namespace pallax {
+
+struct CodeDescription;
 
 /// The state of the EV-DO protocol, its carrier and its levels.
 ///
@@ -20,5 +23,8 @@ namespace pallax {
 ///   38    0    24     kUATI24              0x and six hexadecimal digits
 ///   41    0    8      kColorCode           number
 void parseEVDOStatus(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+/// What that reads and shows, under the log code `logCode`.
+CodeDescription describeEVDOStatus(LogCode logCode);
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/C2K/FingerC2I.h"
 
+#include "LogGenerator/C2K/C2KDescription.h"
 #include "LogGenerator/C2K/C2KFormats.h"
 #include "LogGenerator/C2K/C2KLookup.h"
 #include "LogGenerator/C2K/PilotList.h"
@@ -46,6 +47,15 @@ void parseFingerC2I(const LogRecord& packet, Dictionary& /*state*/, const Dictio
         }
     }
     setLookupValue("kFingerC2I", fingers.listOrNone(), lookup);
+}
+
+CodeDescription describeFingerC2I(LogCode logCode) {
+    CodeDescription code{logCode, kFingers};
+    code.lists = {describePilots("kFingerC2I", {kFingers, kFingerLength, kFingerLength},
+                                 u8At(kFingerCount), u16At(kPN), u16At(kCarrierToInterference))};
+    code.lists.front().fit = ListDescription::Fit::Exact;
+    code.lists.front().only = Condition{u16At(kPN), 0, kUnlocked - 1};
+    return code;
 }
 
 } // namespace pallax

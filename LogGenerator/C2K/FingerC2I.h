@@ -1,9 +1,12 @@
 #pragma once
 
+#include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/PropertyList.h"
 
 namespace pallax {
+
+struct CodeDescription;
 
 /// What the fingers of the EV-DO receiver are locked to, and how well.
 ///
@@ -16,5 +19,8 @@ namespace pallax {
 ///   0     16     PN offset; 0xFFFF: locked to nothing, not shown
 ///   6     16     carrier to interference: 10 x log10(raw / 512), dB
 void parseFingerC2I(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+/// What that reads and shows, under the log code `logCode`.
+CodeDescription describeFingerC2I(LogCode logCode);
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/C2K/ForwardDataRate.h"
 
 #include "LogGenerator/C2K/DataRate.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -56,6 +57,20 @@ void parseForwardDataRate(const LogRecord& packet, Dictionary& state, const Dict
         return;
     }
     updateDataRate(kNames, packet.u32(kSequence), totalOf(packet), state, lookup);
+}
+
+CodeDescription describeForwardDataRate(LogCode logCode) {
+    std::vector<Counter> counters;
+    for (std::size_t counter = 0; counter < kWeights.size(); ++counter) {
+        if (kWeights[counter] != 0) {
+            counters.push_back({kCounters + counter * kCounterLength, kWeights[counter]});
+        }
+    }
+    CodeDescription code{logCode, kMinimumLength};
+    code.fields = {describeDataRate(kNames, u32At(kSequence),
+                                    {kCounters, kWeights.size() * kCounterLength},
+                                    std::move(counters))};
+    return code;
 }
 
 } // namespace pallax

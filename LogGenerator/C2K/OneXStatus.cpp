@@ -1,5 +1,6 @@
 #include "LogGenerator/C2K/OneXStatus.h"
 
+#include "LogGenerator/C2K/C2KDescription.h"
 #include "LogGenerator/C2K/C2KFormats.h"
 #include "LogGenerator/C2K/C2KLabels.h"
 #include "LogGenerator/C2K/C2KLookup.h"
@@ -34,6 +35,12 @@ constexpr std::size_t kRx1Channel = 8;
 constexpr Position kRx0Gain = s8At(10);
 constexpr Position kRx1Gain = s8At(11);
 constexpr Position kTxGain = s16At(12);
+
+// dBm = raw x steps / divisor + offset.
+constexpr double kRxGainSteps = 334.0;
+constexpr double kRxGainDivisor = 1000.0;
+constexpr double kRxGainOffsetDbm = -63.248;
+constexpr double kTxGainDivisor = 10.0;
 
 constexpr std::size_t kEnergyDivisor = 4;
 constexpr std::size_t kEnergyGain = 6;
@@ -96,11 +103,12 @@ PropertyList channel(const LogRecord& radio, std::size_t at) {
 
 PropertyList receiveGain(const LogRecord& radio, const Position& position) {
     const auto raw = static_cast<double>(radio.read(position));
-    return DisplayNumber(raw * 334.0 / 1000.0 - 63.248, kSignedLevelDbm);
+    return DisplayNumber(raw * kRxGainSteps / kRxGainDivisor + kRxGainOffsetDbm, kSignedLevelDbm);
 }
 
 PropertyList transmitGain(const LogRecord& radio) {
-    return DisplayNumber(static_cast<double>(radio.read(kTxGain)) / 10.0, kSignedLevelDbm);
+    return DisplayNumber(static_cast<double>(radio.read(kTxGain)) / kTxGainDivisor,
+                         kSignedLevelDbm);
 }
 
 void showRadio(const LogRecord& radio, bool inTraffic, const Dictionary& lookup) {
@@ -119,7 +127,7 @@ void showRadio(const LogRecord& radio, bool inTraffic, const Dictionary& lookup)
 
 void showOldFrameErrors(Dictionary& state, const Dictionary& lookup) {
     if (const auto rate = trafficFER(state)) {
-        setLookupValue("k1xTrafficFER", shownOldTrafficFER(*rate), lookup);
+        setLookupValue(kTrafficFERName, shownOldTrafficFER(*rate), lookup);
         endTrafficFER(state);
     }
 }
@@ -150,6 +158,54 @@ void parseOneXStatus(const LogRecord& packet, Dictionary& state, const Dictionar
     if (deviceState != kTraffic) {
         showOldFrameErrors(state, lookup);
     }
+}
+
+CodeDescription describeOneXStatus(LogCode logCode) {
+    const auto inTraffic = [](FieldDescription field) {
+        field.condition =
+            Condition{u8At(kDeviceState), kTraffic, kTraffic, kNotAvailable, kSystemStateId};
+        return field;
+    };
+    const auto receiveGain = [](std::string_view name, const Position& position) {
+        return describeNumber(name, position, kSignedLevelDbm, kRxGainSteps / kRxGainDivisor,
+                              kRxGainOffsetDbm);
+    };
+    SubpacketDescription systemState{
+        kSystemStateId,
+        {describeLabel("k1xDeviceState", u8At(kDeviceState), kOneXDeviceStates),
+         describeOldTrafficFER(kDeviceState)}};
+    SubpacketDescription radio{
+        kRadioId,
+        {
+            describeLabel("k1xRx0BandClass", u8At(kRx0BandClass), kBandClasses),
+            describeNumber("k1xRx0ChanNum", u16At(kRx0Channel), kDecimal),
+            receiveGain("k1xRxAGC0", kRx0Gain),
+            inTraffic(describeLabel("k1xRx1BandClass", u8At(kRx1BandClass), kBandClasses)),
+            inTraffic(describeNumber("k1xRx1ChanNum", u16At(kRx1Channel), kDecimal)),
+            inTraffic(receiveGain("k1xRxAGC1", kRx1Gain)),
+            inTraffic(describeNumber("k1xTxAGC", kTxGain, kSignedLevelDbm, 1.0 / kTxGainDivisor)),
+        }};
+    ListDescription pilots;
+    pilots.key = "k1xActiveSetInfo";
+    pilots.count = u8At(kPilotCount);
+    pilots.entryName = u16At(kPN);
+    pilots.formula = "a pilot is 6m + 12 bytes, up to a multiple of 4, m being the byte at 9; the "
+                     "first one begins with the subpacket";
+    pilots.fields = {describeComputed(
+        "", kSignedLevelDb, "scaled energy",
+        "10 x log10 of 2^(2e - 3) x E / (9 x N^2 x g) - 1 / N, at least 0.00001: E, 16 bits, at "
+        "4m + 24 of the pilot, N, g and e of the subpacket",
+        {{kEnergyDivisor, sizeof(std::uint16_t)},
+         {kEnergyGain},
+         {kEnergyExponent},
+         {kPilotSize},
+         {kReferencePN, sizeof(std::uint16_t)}})};
+    CodeDescription code{logCode, kSubpacketsStart};
+    code.subpackets = {std::move(systemState), std::move(radio),
+                       SubpacketDescription{kActiveSetId, {}, {std::move(pilots)}},
+                       SubpacketDescription{kFingersId, {}}};
+    code.note = "Nothing is shown unless all four subpackets are there.";
+    return code;
 }
 
 } // namespace pallax

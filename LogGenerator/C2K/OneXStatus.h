@@ -1,9 +1,12 @@
 #pragma once
 
+#include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/PropertyList.h"
 
 namespace pallax {
+
+struct CodeDescription;
 
 /// The state of the 1x device, its receivers and its active set.
 ///
@@ -37,5 +40,8 @@ namespace pallax {
 /// error rate of the call that has ended is shown once more, as old ("k1xTrafficFER"), and
 /// forgotten.
 void parseOneXStatus(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+/// What that reads and shows, under the log code `logCode`.
+CodeDescription describeOneXStatus(LogCode logCode);
 
 } // namespace pallax

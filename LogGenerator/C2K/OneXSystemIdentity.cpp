@@ -1,5 +1,6 @@
 #include "LogGenerator/C2K/OneXSystemIdentity.h"
 
+#include "LogGenerator/C2K/C2KDescription.h"
 #include "LogGenerator/C2K/C2KFormats.h"
 #include "LogGenerator/C2K/C2KLabels.h"
 #include "LogGenerator/C2K/C2KLookup.h"
@@ -23,6 +24,7 @@ constexpr Position kBaseId = u16At(184);
 
 /// The system type whose identity the packet carries.
 constexpr std::uint32_t kKnownSystemType = 2;
+constexpr std::string_view kUnknownSystemType = "(unknown system type %d)";
 
 } // namespace
 
@@ -46,9 +48,8 @@ void parseOneXSystemIdentity(const LogRecord& packet, Dictionary& /*state*/,
     };
     const auto ofKnownSystem = [&](const Position& position) -> PropertyList {
         // A text, for the number in it is not that of the row.
-        return systemType == kKnownSystemType
-                   ? number(position)
-                   : formatText("(unknown system type %d)", {systemType});
+        return systemType == kKnownSystemType ? number(position)
+                                              : formatText(kUnknownSystemType, {systemType});
     };
     setLookupValue("k1xRoamingHome", kRoamingIndicators.valueOf(packet.u32(kRoamingIndicator)),
                    lookup);
@@ -57,6 +58,26 @@ void parseOneXSystemIdentity(const LogRecord& packet, Dictionary& /*state*/,
     setLookupValue("kPacketZoneId", number(kPacketZoneId), lookup);
     setLookupValue("kBaseId", number(kBaseId), lookup);
     setLookupValue("kProtocolRevision", number(kProtocolRevision), lookup);
+}
+
+CodeDescription describeOneXSystemIdentity(LogCode logCode) {
+    constexpr std::int64_t kLargestVersion = UINT8_MAX;
+    const auto ofKnownSystem = [](FieldDescription field) {
+        field.condition =
+            Condition{u32At(kSystemType), kKnownSystemType, kKnownSystemType, kUnknownSystemType};
+        return field;
+    };
+    CodeDescription code{logCode, kMinimumLength};
+    code.condition = Condition{u8At(kVersion), kLeastVersion, kLargestVersion};
+    code.fields = {
+        describeLabel("k1xRoamingHome", u32At(kRoamingIndicator), kRoamingIndicators),
+        ofKnownSystem(describeNumber("kSystemId", kSystemId, kDecimal)),
+        ofKnownSystem(describeNumber("kNetworkId", kNetworkId, kDecimal)),
+        describeNumber("kPacketZoneId", kPacketZoneId, kDecimal),
+        describeNumber("kBaseId", kBaseId, kDecimal),
+        describeNumber("kProtocolRevision", kProtocolRevision, kDecimal),
+    };
+    return code;
 }
 
 } // namespace pallax

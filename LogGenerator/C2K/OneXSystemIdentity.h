@@ -1,9 +1,12 @@
 #pragma once
 
+#include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/PropertyList.h"
 
 namespace pallax {
+
+struct CodeDescription;
 
 /// Which 1x system serves the phone.
 ///
@@ -18,5 +21,8 @@ namespace pallax {
 ///   133   8      kProtocolRevision   number
 ///   184   16     kBaseId             number; past the end of a shorter packet, so 0
 void parseOneXSystemIdentity(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+/// What that reads and shows, under the log code `logCode`.
+CodeDescription describeOneXSystemIdentity(LogCode logCode);
 
 } // namespace pallax

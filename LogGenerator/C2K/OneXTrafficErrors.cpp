@@ -3,6 +3,7 @@
 #include "LogGenerator/C2K/C2KLookup.h"
 #include "LogGenerator/C2K/Subpackets.h"
 #include "LogGenerator/C2K/TrafficFER.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 namespace pallax {
@@ -27,7 +28,14 @@ void parseOneXTrafficErrors(const LogRecord& packet, Dictionary& state, const Di
         return;
     }
     const bool inError = demodulation->u8(kFrameInError) != 0;
-    setLookupValue("k1xTrafficFER", shownTrafficFER(addTrafficFrame(inError, state)), lookup);
+    setLookupValue(kTrafficFERName, shownTrafficFER(addTrafficFrame(inError, state)), lookup);
+}
+
+CodeDescription describeOneXTrafficErrors(LogCode logCode) {
+    CodeDescription code{logCode, kSubpacketsStart};
+    SubpacketDescription demodulation{kTrafficDemodulationId, {describeTrafficFER(kFrameInError)}};
+    code.subpackets = {std::move(demodulation)};
+    return code;
 }
 
 } // namespace pallax

@@ -1,9 +1,12 @@
 #pragma once
 
+#include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/PropertyList.h"
 
 namespace pallax {
+
+struct CodeDescription;
 
 /// Whether a frame of the 1x traffic channel was in error; the rate of such frames is averaged.
 ///
@@ -12,5 +15,8 @@ namespace pallax {
 ///   11: traffic demodulation
 ///   24    8      k1xTrafficFER   an error unless 0: the average, in per cent
 void parseOneXTrafficErrors(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+/// What that reads and shows, under the log code `logCode`.
+CodeDescription describeOneXTrafficErrors(LogCode logCode);
 
 } // namespace pallax

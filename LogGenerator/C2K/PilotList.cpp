@@ -15,7 +15,7 @@ void PilotList::add(std::size_t index, std::uint16_t pn, DisplayNumber value) {
 }
 
 PropertyList PilotList::listOrNone() const {
-    return empty() ? PropertyList(Text::fixed("(none)")) : list();
+    return empty() ? PropertyList(Text::fixed(kNone)) : list();
 }
 
 double energyInDb(std::uint16_t energy) {

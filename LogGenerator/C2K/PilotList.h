@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <string_view>
 
 namespace pallax {
 
@@ -14,6 +15,9 @@ public:
     PilotList();
 
     void add(std::size_t index, std::uint16_t pn, DisplayNumber value);
+    /// Shown for a list without an entry.
+    static constexpr std::string_view kNone = "(none)";
+
     bool empty() const { return _count == 0; }
 
     /// The list; without an entry it holds nothing but the mark that it is sorted.

@@ -1,6 +1,7 @@
 #include "LogGenerator/C2K/ReverseDataRate.h"
 
 #include "LogGenerator/C2K/DataRate.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -29,12 +30,16 @@ static_assert(kWeights.size() == 12);
 constexpr DataRateNames kNames = {"kRLDataRate", "RLDataSeqNum",  "RLDataSent", "RLDataSeqNum1",
                                   "RLDataSent1", "RLDataSeqNum2", "RLDataSent2"};
 
+/// Where the counters of one rate start in one of the rows of all blocks.
+std::size_t rowStart(std::size_t rate, std::size_t row) {
+    return kCounters + rate * kRateLength + row / kRows * kBlockLength + row % kRows * kRowLength;
+}
+
 /// The counters of one rate, over all blocks.
 std::int64_t countOf(std::size_t rate, const LogRecord& packet) {
     std::int64_t sum = 0;
     for (std::size_t row = 0; row < kBlocks * kRows; ++row) {
-        const std::size_t start =
-            kCounters + rate * kRateLength + row / kRows * kBlockLength + row % kRows * kRowLength;
+        const std::size_t start = rowStart(rate, row);
         for (std::size_t counter = 0; counter < kCountersInARow; ++counter) {
             sum += packet.u32(start + counter * kCounterLength);
         }
@@ -60,6 +65,22 @@ void parseReverseDataRate(const LogRecord& packet, Dictionary& state, const Dict
         return;
     }
     updateDataRate(kNames, packet.u32(kSequence), totalOf(packet), state, lookup);
+}
+
+CodeDescription describeReverseDataRate(LogCode logCode) {
+    std::vector<Counter> counters;
+    for (std::size_t rate = 0; rate < kWeights.size(); ++rate) {
+        for (std::size_t row = 0; row < kBlocks * kRows; ++row) {
+            for (std::size_t counter = 0; counter < kCountersInARow; ++counter) {
+                counters.push_back(
+                    {rowStart(rate, row) + counter * kCounterLength, kWeights[rate]});
+            }
+        }
+    }
+    CodeDescription code{logCode, kMinimumLength};
+    code.fields = {describeDataRate(kNames, u32At(kSequence), {kCounters, kBlocks * kBlockLength},
+                                    std::move(counters))};
+    return code;
 }
 
 } // namespace pallax

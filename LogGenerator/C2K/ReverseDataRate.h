@@ -1,9 +1,12 @@
 #pragma once
 
+#include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/PropertyList.h"
 
 namespace pallax {
+
+struct CodeDescription;
 
 /// How much the EV-DO reverse link has carried: counters by rate, each rate with a weight of its
 /// own. Shown as a rate; see DataRate.h.
@@ -19,5 +22,8 @@ namespace pallax {
 ///   0         4 x 32
 ///   288       4 x 32
 void parseReverseDataRate(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
+
+/// What that reads and shows, under the log code `logCode`.
+CodeDescription describeReverseDataRate(LogCode logCode);
 
 } // namespace pallax

@@ -52,4 +52,17 @@ PropertyList shownOldTrafficFER(float rate) {
     return DisplayNumber(double{percent(rate)}, kOldPercent);
 }
 
+FieldDescription describeTrafficFER(std::size_t frameInError) {
+    return describeComputed(kTrafficFERName, kPercent, "frame errors",
+                            "a frame is in error unless the byte is 0; of the call's frames so far "
+                            "the average in which the newest has a weight of 1/64",
+                            {{frameInError}});
+}
+
+FieldDescription describeOldTrafficFER(std::size_t deviceState) {
+    return describeComputed(kTrafficFERName, kOldPercent, "old frame errors",
+                            "outside Traffic, once: the average of the call that is over",
+                            {{deviceState}});
+}
+
 } // namespace pallax

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/Records/Description.h"
 #include "platform/PropertyList.h"
 
 #include <optional>
@@ -8,6 +9,9 @@ namespace pallax {
 
 /// The frame error rate of the 1x traffic channel, an exponential average between 0 and 1 that
 /// lives in the state under "TrafficFER" for as long as a call. Single precision throughout.
+
+/// The lookup name under which it is shown.
+inline constexpr std::string_view kTrafficFERName = "k1xTrafficFER";
 
 /// The rate so far; nothing when no call has reported a frame yet.
 std::optional<float> trafficFER(const Dictionary& state);
@@ -22,5 +26,10 @@ void endTrafficFER(Dictionary& state);
 PropertyList shownTrafficFER(float rate);
 /// The same, of a call that is over.
 PropertyList shownOldTrafficFER(float rate);
+
+/// The rate that is shown where the byte at `frameInError` tells of a frame: an error unless 0.
+FieldDescription describeTrafficFER(std::size_t frameInError);
+/// The rate of a call that is over, as the device state at that byte tells.
+FieldDescription describeOldTrafficFER(std::size_t deviceState);
 
 } // namespace pallax

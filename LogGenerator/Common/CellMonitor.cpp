@@ -1,5 +1,6 @@
 #include "LogGenerator/Common/CellMonitor.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/Formats.h"
 #include "platform/SystemLog.h"
 #include "platform/TelephonyConstants.h"
@@ -9,6 +10,8 @@
 namespace pallax {
 
 namespace {
+
+constexpr std::int16_t kNotMeasured = 32767;
 
 bool holds(const Dictionary& cell, std::string_view key, std::string_view value) {
     const PropertyList* found = cell.find(key);
@@ -77,7 +80,6 @@ void showCellNumbers(const DictionaryRef& target, std::span<const CellNumber> nu
 }
 
 PropertyList cellLevel(std::int32_t number, const NumberFormat& format, int factor) {
-    constexpr std::int16_t kNotMeasured = 32767;
     const auto level = static_cast<std::int16_t>(number);
     if (level == kNotMeasured) {
         return Text::fixed("");
@@ -108,6 +110,27 @@ Array cellEntries(const Array& cells, std::string_view radioAccessTechnology,
         }
     }
     return entries;
+}
+
+CodeDescription describeCells(std::string_view part, std::span<const CellNumber> numbers,
+                              std::span<const CellLevel> levels) {
+    CodeDescription code{kCellMonitorLogCode};
+    code.listPart = part;
+    for (const CellNumber& number : numbers) {
+        FieldDescription field{std::string(number.key)};
+        field.shownAs.format = &kDecimal;
+        field.listKey = number.cellKey;
+        code.fields.push_back(std::move(field));
+    }
+    for (const CellLevel& level : levels) {
+        FieldDescription field{std::string(level.key)};
+        field.shownAs.format = level.format;
+        field.shownAs.factor = level.factor;
+        field.shownAs.exceptional = kNotMeasured;
+        field.listKey = level.cellKey;
+        code.fields.push_back(std::move(field));
+    }
+    return code;
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/PropertyList.h"
 
@@ -73,5 +74,9 @@ void showCellLevels(const DictionaryRef& target, std::span<const CellLevel> leve
 Array cellEntries(const Array& cells, std::string_view radioAccessTechnology,
                   std::string_view cellType, std::span<const CellNumber> numbers,
                   std::span<const CellLevel> levels);
+
+/// What `showCellNumbers` and `showCellLevels` show of that part of the array.
+CodeDescription describeCells(std::string_view part, std::span<const CellNumber> numbers,
+                              std::span<const CellLevel> levels);
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/Common/PDPContextList.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "platform/PropertyListCodec.h"
 #include "platform/SystemLog.h"
 
@@ -22,6 +23,13 @@ void PDPContextList::updateWithData(const LogRecord& record, LogCode /*logCode*/
     if (contexts != nullptr) {
         replaceList(*contexts);
     }
+}
+
+RecordDescription PDPContextList::describe() const {
+    CodeDescription code{kPDPContextsLogCode};
+    code.listPart = "the array of contexts, as the telephony service describes them";
+    code.listIsEntries = true;
+    return {std::move(code)};
 }
 
 } // namespace pallax

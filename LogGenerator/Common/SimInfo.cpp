@@ -1,6 +1,7 @@
 #include "LogGenerator/Common/SimInfo.h"
 
 #include "LogGenerator/Common/LogCode_0xFF000020.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 namespace pallax {
@@ -49,6 +50,17 @@ void SimInfo::updateWithData(const LogRecord& record, LogCode logCode) {
             show(simFile.key, *content);
         }
     }
+}
+
+RecordDescription SimInfo::describe() const {
+    CodeDescription code{kSimFilesLogCode};
+    code.listPart = "the dictionary of SIM files; values of any type, as they come";
+    for (const SimFile& simFile : kSimFiles) {
+        FieldDescription field{std::string(simFile.key)};
+        field.listKey = simFile.propertyListKey;
+        code.fields.push_back(std::move(field));
+    }
+    return {std::move(code)};
 }
 
 } // namespace pallax

@@ -31,6 +31,7 @@ public:
     std::span<const LogCode> getLogCodeArray() const override;
     /// Throws LogCode_0xFF000020::UnknownDataException when the payload is no property list.
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    RecordDescription describe() const override;
 };
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/LTE/ConnectedModeMeasurementMisc.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -30,6 +31,10 @@ std::span<const LogCode> ConnectedModeMeasurementMisc::getLogCodeArray() const {
 void ConnectedModeMeasurementMisc::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "Connected mode LTE Intra-frequency Measurement");
     showGroup(kGroups, record, logCode);
+}
+
+RecordDescription ConnectedModeMeasurementMisc::describe() const {
+    return describeGroups(kGroups);
 }
 
 } // namespace pallax

@@ -21,6 +21,7 @@ public:
     }
     std::span<const LogCode> getLogCodeArray() const override;
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    RecordDescription describe() const override;
 };
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/LTE/DetectedCells.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -45,6 +46,16 @@ void DetectedCells::updateWithData(const LogRecord& record, LogCode logCode) {
             fillEntry(target, kCellFields, entry);
         });
     }
+}
+
+RecordDescription DetectedCells::describe() const {
+    const EntryList::Layout behindNoNeighbours = layoutOf(LogRecord());
+    ListDescription list =
+        describeList("", behindNoNeighbours, u8At(kDetectedCountOffset), kCellFields);
+    list.entries.move = EntryRun::Move{kMeasuredEntryLength, u8At(kMeasuredCountOffset)};
+    CodeDescription code{kConnectedModeLogCode, kConnectedModeLength};
+    code.lists = {std::move(list)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/LTE/LTEServingCellInfo.h"
 
 #include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 #include "platform/TelephonyConstants.h"
 
@@ -106,6 +107,16 @@ void LTEServingCellInfo::updateFromCellMonitor(const LogRecord& record) {
                                             kHXCellMonitorCellTypeServing)) {
         showCellNumbers(sectionRef().dictionary(), kCellNumbers, *cell);
     }
+}
+
+RecordDescription LTEServingCellInfo::describe() const {
+    CodeDescription identity{kIdentityLogCode, kIdentityRecordLength};
+    identity.fields = describeFields(kIdentityFields);
+    identity.note = "Removes \"UARFCN\", which is of the cell before.";
+    CodeDescription antennas{kAntennasLogCode, kAntennasRecordLength};
+    antennas.fields = describeFields(kAntennasFields);
+    return {std::move(identity), std::move(antennas),
+            describeCells("the first serving cell of LTE", kCellNumbers, {})};
 }
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/LTE/MeasuredNeighborCells.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -56,6 +57,16 @@ void MeasuredNeighborCells::updateWithData(const LogRecord& record, LogCode logC
             fillEntry(target, kNeighbourFields, entry);
         });
     }
+}
+
+RecordDescription MeasuredNeighborCells::describe() const {
+    ListDescription list =
+        describeList("", kNeighbours, u8At(kMeasuredCountOffset), kNeighbourFields);
+    list.sizeCheck = SizeCheck{u8At(kDetectedCountOffset), kDetectedEntryLength};
+    CodeDescription code{kConnectedModeLogCode, kConnectedModeLength};
+    code.lists = {std::move(list)};
+    code.note = "A record whose counts claim more than it seems to hold empties the list.";
+    return {std::move(code)};
 }
 
 } // namespace pallax

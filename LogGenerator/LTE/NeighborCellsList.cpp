@@ -1,6 +1,7 @@
 #include "LogGenerator/LTE/NeighborCellsList.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -76,6 +77,14 @@ void NeighborCellsList::updateWithData(const LogRecord& record, LogCode logCode)
     systemLog(LogPriority::Warning, "Number of neighboring cells being reported: %d\n", count);
     const EntryList cells(record, kCells, count);
     replaceList(cells, fillCell);
+}
+
+RecordDescription NeighborCellsList::describe() const {
+    ListDescription list = describeList("", kCells, kCountLessOne, kCellFields);
+    list.plus = 1;
+    CodeDescription code{kNeighborMeasurementLogCode, kNeighborMeasurementLength};
+    code.lists = {std::move(list)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

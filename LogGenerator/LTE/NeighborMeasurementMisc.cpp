@@ -1,6 +1,7 @@
 #include "LogGenerator/LTE/NeighborMeasurementMisc.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -28,6 +29,10 @@ std::span<const LogCode> NeighborMeasurementMisc::getLogCodeArray() const {
 void NeighborMeasurementMisc::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "Neighbor Measurements");
     showGroup(kGroups, record, logCode);
+}
+
+RecordDescription NeighborMeasurementMisc::describe() const {
+    return describeGroups(kGroups);
 }
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/LTE/ReselectionCandidatesList.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -54,16 +55,19 @@ constexpr auto kTechnologies = std::to_array<CandidateTechnology>({
     {"CDMAHRPD", kCdmaFields, 12},
 });
 static_assert(kTechnologies.size() == 5);
+constexpr std::string_view kTechnologyKey = "Candidate RAT Type";
+constexpr std::string_view kOtherTechnology = "??";
 
 CandidateTechnology technologyOf(const LogRecord& entry) {
     const std::size_t technology = entry.u16(kTechnologyInEntry);
-    return technology < kTechnologies.size() ? kTechnologies[technology]
-                                             : CandidateTechnology{"??", {}, kHeadLength};
+    return technology < kTechnologies.size()
+               ? kTechnologies[technology]
+               : CandidateTechnology{kOtherTechnology, {}, kHeadLength};
 }
 
 PropertyList candidateOf(const LogRecord& entry, const CandidateTechnology& technology) {
     Dictionary candidate = entryOf(kHeadFields, entry);
-    candidate.setFixed("Candidate RAT Type", Text::fixed(technology.label));
+    candidate.setFixed(kTechnologyKey, Text::fixed(technology.label));
     showFields(candidate, technology.fields, entry);
     return candidate;
 }
@@ -102,6 +106,36 @@ void ReselectionCandidatesList::updateWithData(const LogRecord& record, LogCode 
     if (entries.count() != 0) {
         replaceList(candidatesOf(entries));
     }
+}
+
+namespace {
+
+constexpr auto kTechnologyLabels = [] {
+    std::array<std::string_view, kTechnologies.size()> labels{};
+    for (std::size_t index = 0; index < labels.size(); ++index) {
+        labels[index] = kTechnologies[index].label;
+    }
+    return labels;
+}();
+
+} // namespace
+
+RecordDescription ReselectionCandidatesList::describe() const {
+    const Position technology = u16At(kTechnologyInEntry);
+    ListDescription list = describeList("", kCandidates, u16At(kCountOffset), kHeadFields);
+    list.fields.push_back({std::string(kTechnologyKey), technology,
+                           Conversion::label(kTechnologyLabels, kOtherTechnology).shownAs()});
+    std::int64_t number = 0;
+    for (const CandidateTechnology& each : kTechnologies) {
+        for (FieldDescription field : describeFields(each.fields)) {
+            field.condition = Condition{technology, number, number};
+            list.fields.push_back(std::move(field));
+        }
+        ++number;
+    }
+    CodeDescription code{kReselectionLogCode, kReselectionLength};
+    code.lists = {std::move(list)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/LTE/ReselectionCandidatesMisc.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -28,6 +29,10 @@ std::span<const LogCode> ReselectionCandidatesMisc::getLogCodeArray() const {
 void ReselectionCandidatesMisc::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "Reselection Candidates");
     showGroup(kGroups, record, logCode);
+}
+
+RecordDescription ReselectionCandidatesMisc::describe() const {
+    return describeGroups(kGroups);
 }
 
 } // namespace pallax

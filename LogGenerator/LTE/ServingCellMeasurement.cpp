@@ -1,6 +1,7 @@
 #include "LogGenerator/LTE/ServingCellMeasurement.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -56,6 +57,10 @@ std::span<const LogCode> ServingCellMeasurement::getLogCodeArray() const {
 void ServingCellMeasurement::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "Serving Cell Measurements");
     showGroup(kGroups, record, logCode);
+}
+
+RecordDescription ServingCellMeasurement::describe() const {
+    return describeGroups(kGroups);
 }
 
 } // namespace pallax

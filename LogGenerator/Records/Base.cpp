@@ -1,6 +1,7 @@
 #include "LogGenerator/Records/Base.h"
 
 #include "LogGenerator/Records/ArrayLock.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/Exceptions.h"
 #include "platform/SystemLog.h"
 
@@ -134,6 +135,10 @@ std::int16_t Base::lookUpECNO(std::uint32_t value) {
     const auto* band = std::find_if(std::begin(kBands), std::end(kBands),
                                     [value](const Band& row) { return value >= row.least; });
     return band != std::end(kBands) ? band->decibels : std::int16_t{0};
+}
+
+RecordDescription Base::describe() const {
+    throw UnrecognisedOperation("describe");
 }
 
 } // namespace pallax

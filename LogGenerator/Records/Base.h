@@ -17,6 +17,9 @@
 namespace pallax {
 
 class Base;
+struct CodeDescription;
+/// What a record reads and shows, code by code.
+using RecordDescription = std::vector<CodeDescription>;
 
 /// Section name to record. The records are owned by the class index.
 using ClassDict = std::map<std::string, Base*, std::less<>>;
@@ -52,6 +55,8 @@ public:
     virtual std::span<const LogCode> getLogCodeArray() const;
     /// What kind of section the template must hold for this record.
     virtual SectionKind sectionKind() const { return SectionKind::Keys; }
+    /// What `updateWithData` reads and shows, out of the tables that it reads with (Description.h).
+    virtual RecordDescription describe() const;
 
     /// Appends this record to the subscribers of each of its codes.
     void updateLogCodeDict(CodeDict& codeDict);

@@ -60,4 +60,19 @@ void fillEntry(Dictionary& entry, std::span<const Field> fields, const LogRecord
     showFields(entry, fields, record);
 }
 
+ShownAs Conversion::shownAs() const {
+    ShownAs result;
+    result.format = _format;
+    result.factor = _factor;
+    result.offset = _offset;
+    result.labels = _labels;
+    result.shift = _shift;
+    result.beyond = _beyond;
+    if (_exceptional != kNone) {
+        result.exceptional = _exceptional;
+        result.exceptionalText = _exceptionalText;
+    }
+    return result;
+}
+
 } // namespace pallax

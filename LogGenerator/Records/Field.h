@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Records/Formats.h"
 #include "LogGenerator/Records/LogRecord.h"
+#include "LogGenerator/Records/ShownAs.h"
 #include "platform/PropertyList.h"
 
 #include <cstdint>
@@ -59,6 +60,8 @@ public:
     void showIn(PropertyList& value, std::int64_t raw) const;
 
     constexpr bool isNumber() const { return _format != nullptr; }
+    /// The conversion as data.
+    ShownAs shownAs() const;
 
 private:
     static constexpr std::int64_t kNone = INT64_MIN;

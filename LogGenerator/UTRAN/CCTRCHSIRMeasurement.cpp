@@ -1,5 +1,6 @@
 #include "LogGenerator/UTRAN/CCTRCHSIRMeasurement.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/UTRAN/ChannelQuality.h"
 #include "platform/SystemLog.h"
 
@@ -12,6 +13,8 @@ constexpr auto kFields = std::to_array<Field>({
     {"TSNUM", u8At(1), Conversion::number()},
 });
 
+constexpr std::string_view kRatiosKey = "SIR";
+constexpr Position kRatio = u8At(0);
 constexpr std::size_t kRatioCount = 6;
 constexpr EntryList::Layout kRatios{.start = 2, .stride = 1, .bytesRead = 1};
 
@@ -20,8 +23,8 @@ PropertyList channelOf(const LogRecord& entry) {
     channel.reserve(kFields.size() + 1);
     showFields(channel, kFields, entry);
     const EntryList ratios(entry, kRatios, kRatioCount);
-    channel.setFixed("SIR", ratios.map([](const LogRecord& ratio, std::size_t /*index*/) {
-        return DisplayNumber(std::int64_t{ratio.u8(0)}, kDecimal);
+    channel.setFixed(kRatiosKey, ratios.map([](const LogRecord& ratio, std::size_t /*index*/) {
+        return DisplayNumber(std::int64_t{ratio.u8(kRatio.byte)}, kDecimal);
     }));
     return channel;
 }
@@ -40,6 +43,21 @@ void CCTRCHSIRMeasurement::updateWithData(const LogRecord& record, LogCode logCo
     clearList();
     replaceList(compositeChannels(record).map(
         [](const LogRecord& entry, std::size_t /*index*/) { return channelOf(entry); }));
+}
+
+RecordDescription CCTRCHSIRMeasurement::describe() const {
+    ListDescription ratios;
+    ratios.key = kRatiosKey;
+    ratios.entries.layout = kRatios;
+    ratios.plus = kRatioCount;
+    ratios.fields = {describeField({"", kRatio, Conversion::number()})};
+    ListDescription channels =
+        describeList("", kCompositeChannels, kCompositeChannelCount, kFields);
+    channels.entries.move = EntryRun::Move{kPerTransportChannel, kTransportChannelCount};
+    channels.lists = {std::move(ratios)};
+    CodeDescription code{kChannelQualityLogCode, kChannelQualityMinimumLength};
+    code.lists = {std::move(channels)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

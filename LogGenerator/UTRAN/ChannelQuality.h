@@ -22,21 +22,26 @@ inline constexpr LogCode kChannelQualityLogCode = 0xD00C;
 inline constexpr auto kChannelQualityLogCodes = std::to_array<LogCode>({kChannelQualityLogCode});
 inline constexpr std::size_t kChannelQualityMinimumLength = 17;
 
+inline constexpr Position kTransportChannelCount = bitsAt(14, 6, 6);
+inline constexpr EntryList::Layout kTransportChannels{.start = 17, .stride = 2, .bytesRead = 2};
+
+inline constexpr Position kCompositeChannelCount = bitsAt(15, 4, 4);
+/// Where they begin when there is no transport channel.
+inline constexpr EntryList::Layout kCompositeChannels{.start = 289, .stride = 8, .bytesRead = 8};
+inline constexpr std::size_t kPerTransportChannel = 34;
+
 inline std::size_t transportChannelCount(const LogRecord& record) {
-    return static_cast<std::size_t>(record.read(bitsAt(14, 6, 6)));
+    return static_cast<std::size_t>(record.read(kTransportChannelCount));
 }
 
 inline EntryList transportChannels(const LogRecord& record) {
-    constexpr EntryList::Layout kLayout{.start = 17, .stride = 2, .bytesRead = 2};
-    return {record, kLayout, transportChannelCount(record)};
+    return {record, kTransportChannels, transportChannelCount(record)};
 }
 
 inline EntryList compositeChannels(const LogRecord& record) {
-    constexpr std::size_t kFirstStart = 289;
-    constexpr std::size_t kPerTransportChannel = 34;
-    const std::size_t start = kFirstStart + kPerTransportChannel * transportChannelCount(record);
-    const EntryList::Layout layout{.start = start, .stride = 8, .bytesRead = 8};
-    return {record, layout, static_cast<std::size_t>(record.read(bitsAt(15, 4, 4)))};
+    EntryList::Layout layout = kCompositeChannels;
+    layout.start += kPerTransportChannel * transportChannelCount(record);
+    return {record, layout, static_cast<std::size_t>(record.read(kCompositeChannelCount))};
 }
 
 } // namespace pallax

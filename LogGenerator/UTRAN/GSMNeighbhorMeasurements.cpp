@@ -1,5 +1,6 @@
 #include "LogGenerator/UTRAN/GSMNeighbhorMeasurements.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -44,6 +45,14 @@ void GSMNeighbhorMeasurements::updateWithData(const LogRecord& record, LogCode l
         return;
     }
     clearList(); // the cells are for whoever asks for them, not for the display
+}
+
+RecordDescription GSMNeighbhorMeasurements::describe() const {
+    CodeDescription code{kNeighboursLogCode, kMinimumLength};
+    code.lists = {describeList("", kCells, u8At(kCellCountOffset), kFields)};
+    code.lists.front().isShown = false;
+    code.note = "Empties the list; the cells of the record are not shown.";
+    return {std::move(code)};
 }
 
 } // namespace pallax

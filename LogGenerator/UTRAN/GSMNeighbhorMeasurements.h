@@ -29,6 +29,7 @@ public:
     std::span<const LogCode> getLogCodeArray() const override;
     SectionKind sectionKind() const override { return SectionKind::List; }
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    RecordDescription describe() const override;
 
     /// The cells of a record of at least 17 bytes, up to the first that is not whole.
     static Array cellsOf(const LogRecord& record);

@@ -1,5 +1,6 @@
 #include "LogGenerator/UTRAN/RRC_State.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -26,7 +27,9 @@ constexpr auto kModes = std::to_array<std::string_view>({
     "Cell URA PCH",
 });
 static_assert(kModes.size() == 6);
-constexpr Conversion kModeLabel = Conversion::label(kModes, "Unknown RRC Mode");
+constexpr std::string_view kUnknownMode = "Unknown RRC Mode";
+constexpr Conversion kModeLabel = Conversion::label(kModes, kUnknownMode);
+constexpr std::string_view kStateKey = "State";
 
 std::uint8_t modeOf(const LogRecord& record) {
     return record.u8(kVersionOffset) == kKnownVersion ? record.u8(kModeOffset)
@@ -50,9 +53,18 @@ void RRC_State::updateWithData(const LogRecord& record, LogCode logCode) {
     }
     const std::uint8_t mode = modeOf(record);
     const PropertyList label = kModeLabel.valueOf(mode);
-    show("State", label);
+    show(kStateKey, label);
     systemLog(LogPriority::Warning, "Display Dict = %@, rrc mode = %d %@", sectionRef(), mode,
               label);
+}
+
+RecordDescription RRC_State::describe() const {
+    FieldDescription state = describeField({kStateKey, u8At(kModeOffset), kModeLabel});
+    state.condition = Condition{u8At(kVersionOffset), kKnownVersion, kKnownVersion, kUnknownMode};
+    CodeDescription code{kStateLogCode, LogRecord::kHeaderLength};
+    code.fields = {std::move(state)};
+    code.note = "A record of less than 15 bytes is reported and read all the same.";
+    return {std::move(code)};
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/UTRAN/TRCHBLERMeasurement.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/UTRAN/ChannelQuality.h"
 #include "platform/SystemLog.h"
 
@@ -27,6 +28,12 @@ void TRCHBLERMeasurement::updateWithData(const LogRecord& record, LogCode logCod
     replaceList(transportChannels(record), [](Dictionary& target, const LogRecord& entry) {
         fillEntry(target, kFields, entry);
     });
+}
+
+RecordDescription TRCHBLERMeasurement::describe() const {
+    CodeDescription code{kChannelQualityLogCode, kChannelQualityMinimumLength};
+    code.lists = {describeList("", kTransportChannels, kTransportChannelCount, kFields)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/UTRAN/UTRANNeighbhorMeasurements.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -58,6 +59,18 @@ void UTRANNeighbhorMeasurements::updateWithData(const LogRecord& record, LogCode
     clearList();
     const EntryList cells(record, kCells, static_cast<std::size_t>(record.read(kCellCount)));
     replaceList(cells, fillCell);
+}
+
+RecordDescription UTRANNeighbhorMeasurements::describe() const {
+    ListDescription list = describeList("", kCells, kCellCount, kFields);
+    for (FieldDescription& field : list.fields) {
+        if (field.key == kStatusField.key) {
+            field.condition = Condition{kStatus, 0, std::int64_t{kStatuses.size()} - 1};
+        }
+    }
+    CodeDescription code{kNeighboursLogCode, kMinimumLength};
+    code.lists = {std::move(list)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/UTRAN/UTRANServingCellInfo.h"
 
 #include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 #include "platform/TelephonyConstants.h"
 
@@ -72,6 +73,20 @@ void UTRANServingCellInfo::showServingCell(const PropertyList& cell) {
         show(kUplinkKey, DisplayNumber(std::int64_t{*uarfcn}, kDecimal));
         show(kDownlinkKey, DisplayNumber(std::int64_t{*uarfcn}, kDecimal));
     }
+}
+
+RecordDescription UTRANServingCellInfo::describe() const {
+    CodeDescription cell{kServingCellLogCode, kServingCellLength};
+    cell.fields = describeFields(kFields);
+    CodeDescription monitored =
+        describeCells("each serving cell of UTRAN, so that the last one stays", kCellNumbers, {});
+    for (const std::string_view key : {kUplinkKey, kDownlinkKey}) {
+        FieldDescription field{std::string(key)};
+        field.shownAs.format = &kDecimal;
+        field.listKey = kHXCellMonitorUARFCN;
+        monitored.fields.push_back(std::move(field));
+    }
+    return {std::move(cell), std::move(monitored)};
 }
 
 } // namespace pallax

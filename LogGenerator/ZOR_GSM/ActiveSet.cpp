@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/ActiveSet.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 
 #include <algorithm>
@@ -62,6 +63,34 @@ Array ActiveSet::cellsOf(const LogRecord& record) const {
         active.emplace_back(std::move(cell));
     }
     return active;
+}
+
+RecordDescription ActiveSet::describe() const {
+    std::vector<Extent> energies;
+    for (const std::size_t offset : kEnergyOffsets) {
+        energies.push_back(extentOf(u32At(offset), Extent::Origin::Companion));
+    }
+    std::vector<Extent> energiesAndAgc = energies;
+    energiesAndAgc.push_back(extentOf(kReceiveAgc, Extent::Origin::Record));
+
+    const EntryList::Layout cells{kCellsStart, kCellStride, kCellBytesRead};
+    ListDescription list = describeList("", cells, u8At(kCellCountOffset), kCellFields);
+    list.only = Condition{kSetType, kActive, kActive};
+    list.companion = EntryRun{{kCellsStart, kPathLength, kPathLength},
+                              EntryRun::Move{kCellStride, u8At(kCellCountOffset)}};
+    list.fields.push_back(describeComputed(
+        "RSCP", kDecimalDb, "rscp",
+        "(A + 512) / 10 toward zero - 106 + Energy Per Chip, A being the receive AGC, signed",
+        std::move(energiesAndAgc)));
+    list.fields.push_back(describeComputed(
+        "Energy Per Chip", kDecimalDb, "ecno",
+        "whole dB of the first of the three energies of the cell's path that is not 0",
+        std::move(energies)));
+
+    RecordDescription description = SearcherSet::describe();
+    description.front().lists = {std::move(list)};
+    description.front().note = "Only the cells of the active set are shown.";
+    return description;
 }
 
 } // namespace pallax

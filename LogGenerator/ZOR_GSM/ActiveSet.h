@@ -32,6 +32,7 @@ class ActiveSet final : public SearcherSet {
 public:
     ActiveSet() : SearcherSet("ActiveSet") {}
     std::string_view getSectionName() const override { return "Active Set"; }
+    RecordDescription describe() const override;
 
 private:
     Array cellsOf(const LogRecord& record) const override;

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/BLER.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -14,6 +15,7 @@ constexpr auto kLogCodes = std::to_array<LogCode>({kBlockErrorLogCode});
 constexpr std::size_t kMinimumLength = 16;
 
 constexpr std::size_t kChannelCountOffset = 13;
+constexpr std::string_view kChannelsKey = "Transport Channels";
 constexpr EntryList::Layout kChannels{16, 9, 9};
 
 constexpr auto kFields = std::to_array<Field>({
@@ -42,9 +44,16 @@ void BLER::updateWithData(const LogRecord& record, LogCode logCode) {
     }
     show(kFields, record);
     const EntryList channels(record, kChannels, record.u8(kChannelCountOffset));
-    show("Transport Channels", channels.map([](const LogRecord& channel, std::size_t /*index*/) {
+    show(kChannelsKey, channels.map([](const LogRecord& channel, std::size_t /*index*/) {
         return entryOf(kChannelFields, channel);
     }));
+}
+
+RecordDescription BLER::describe() const {
+    CodeDescription code{kBlockErrorLogCode, kMinimumLength};
+    code.fields = describeFields(kFields);
+    code.lists = {describeList(kChannelsKey, kChannels, u8At(kChannelCountOffset), kChannelFields)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

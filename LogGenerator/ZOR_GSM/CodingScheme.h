@@ -11,6 +11,7 @@ public:
     std::string_view getSectionName() const override { return "Coding Scheme"; }
     std::span<const LogCode> getLogCodeArray() const override { return {}; }
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    RecordDescription describe() const override;
 };
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/EquivalentPLMNList.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -14,6 +15,9 @@ constexpr std::size_t kMinimumLength = 17;
 constexpr std::size_t kCountOffset = 16;
 constexpr EntryList::Layout kEntries{.start = 17, .stride = 3, .bytesRead = 6};
 
+constexpr std::string_view kCountryCodeKey = "Mobile Country Code";
+constexpr std::string_view kNetworkCodeKey = "Mobile Network Code";
+
 /// Three digits, every second byte from `at` on.
 PropertyList codeAt(const LogRecord& entry, std::size_t at) {
     const int code = entry.u8(at) * 100 + entry.u8(at + 2) * 10 + entry.u8(at + 4);
@@ -22,8 +26,8 @@ PropertyList codeAt(const LogRecord& entry, std::size_t at) {
 
 PropertyList networkOf(const LogRecord& entry) {
     Dictionary network;
-    network.setFixed("Mobile Country Code", codeAt(entry, 0));
-    network.setFixed("Mobile Network Code", codeAt(entry, 1));
+    network.setFixed(kCountryCodeKey, codeAt(entry, 0));
+    network.setFixed(kNetworkCodeKey, codeAt(entry, 1));
     return network;
 }
 
@@ -47,6 +51,20 @@ void EquivalentPLMNList::updateWithData(const LogRecord& record, LogCode logCode
         replaceList(
             entries.map([](const LogRecord& entry, std::size_t) { return networkOf(entry); }));
     }
+}
+
+RecordDescription EquivalentPLMNList::describe() const {
+    const auto digits = [](std::string_view key, std::size_t first) {
+        return describeComputed(key, kDecimal, "digits",
+                                "100 x the first byte + 10 x the second + the third",
+                                {{first}, {first + 2}, {first + 4}});
+    };
+    ListDescription list = describeList("", kEntries, u8At(kCountOffset), {});
+    list.fields = {digits(kCountryCodeKey, 0), digits(kNetworkCodeKey, 1)};
+    CodeDescription code{kEquivalentPLMNLogCode, kMinimumLength};
+    code.lists = {std::move(list)};
+    code.note = "Neighbouring entries overlap by three bytes.";
+    return {std::move(code)};
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/GPRSInformation.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/SharedLogCodes.h"
 #include "platform/SystemLog.h"
 
@@ -123,6 +124,10 @@ std::span<const LogCode> GPRSInformation::getLogCodeArray() const {
 void GPRSInformation::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "GPRSInformation");
     showGroup(kGroups, record, logCode);
+}
+
+RecordDescription GPRSInformation::describe() const {
+    return describeGroups(kGroups);
 }
 
 } // namespace pallax

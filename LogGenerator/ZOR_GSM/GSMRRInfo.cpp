@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/GSMRRInfo.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/SharedLogCodes.h"
 #include "platform/SystemLog.h"
 
@@ -74,6 +75,10 @@ std::span<const LogCode> GSMRRInfo::getLogCodeArray() const {
 void GSMRRInfo::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "GSMRRInfo");
     showGroup(kGroups, record, logCode);
+}
+
+RecordDescription GSMRRInfo::describe() const {
+    return describeGroups(kGroups);
 }
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/GSMServingCell.h"
 
 #include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/SharedLogCodes.h"
 #include "platform/SystemLog.h"
 #include "platform/TelephonyConstants.h"
@@ -68,6 +69,12 @@ void GSMServingCell::showServingCell(const LogRecord& record) {
                                             kHXCellMonitorCellTypeServing)) {
         showCellNumbers(sectionRef().dictionary(), kCellNumbers, *cell);
     }
+}
+
+RecordDescription GSMServingCell::describe() const {
+    RecordDescription description = describeGroups(kGroups);
+    description.push_back(describeCells("the first serving cell of GSM", kCellNumbers, {}));
+    return description;
 }
 
 } // namespace pallax

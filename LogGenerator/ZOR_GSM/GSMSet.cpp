@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/GSMSet.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "LogGenerator/ZOR_GSM/RankingRecord.h"
 #include "platform/SystemLog.h"
@@ -44,6 +45,13 @@ void GSMSet::updateWithData(const LogRecord& record, LogCode logCode) {
             fillEntry(target, kEntryFields, entry);
         });
     }
+}
+
+RecordDescription GSMSet::describe() const {
+    CodeDescription code{kRankingLogCode, kRankingRecordLength};
+    code.lists = {describeList("", {kRankingEntriesStart, kEntryLength, kEntryLength},
+                               u8At(kCountOffset), kEntryFields)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/HSDPAInformation.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -34,6 +35,8 @@ constexpr auto kProcessFields = std::to_array<Field>({
     {"Block Errors", u16At(7), Conversion::number(kUnsignedDecimal)},
 });
 
+constexpr std::string_view kPrimaryKey = "Primary HARQ Process";
+constexpr std::string_view kSecondaryKey = "Secondary HARQ Process";
 constexpr std::size_t kPrimaryCountOffset = 16;
 constexpr std::size_t kSecondaryCountOffset = 17;
 constexpr std::size_t kProcessesStart = 18;
@@ -62,14 +65,29 @@ void HSDPAInformation::updateWithData(const LogRecord& record, LogCode logCode) 
     show(kFields, record);
     const std::size_t primaryCount = record.u8(kPrimaryCountOffset);
     if (primaryCount != 0) {
-        show("Primary HARQ Process", processesOf(record, kProcessesStart, primaryCount));
+        show(kPrimaryKey, processesOf(record, kProcessesStart, primaryCount));
     }
     const std::size_t secondaryCount = record.u8(kSecondaryCountOffset);
     if (secondaryCount == 0) {
         return;
     }
-    show("Secondary HARQ Process",
+    show(kSecondaryKey,
          processesOf(record, kProcessesStart + kPrimaryStride * primaryCount, secondaryCount));
+}
+
+RecordDescription HSDPAInformation::describe() const {
+    const EntryList::Layout processes{kProcessesStart, kProcessLength, kProcessLength};
+    ListDescription primary =
+        describeList(kPrimaryKey, processes, u8At(kPrimaryCountOffset), kProcessFields);
+    primary.staysWithoutEntries = true;
+    ListDescription secondary =
+        describeList(kSecondaryKey, processes, u8At(kSecondaryCountOffset), kProcessFields);
+    secondary.staysWithoutEntries = true;
+    secondary.entries.move = EntryRun::Move{kPrimaryStride, u8At(kPrimaryCountOffset)};
+    CodeDescription code{kHarqLogCode, kMinimumLength};
+    code.fields = describeFields(kFields);
+    code.lists = {std::move(primary), std::move(secondary)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

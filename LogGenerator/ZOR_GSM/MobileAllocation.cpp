@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/MobileAllocation.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 
@@ -12,7 +13,9 @@ constexpr auto kLogCodes = std::to_array<LogCode>({kMobileAllocationLogCode});
 
 constexpr std::size_t kMinimumLength = 15;
 constexpr std::size_t kCountOffset = 14;
+constexpr std::string_view kChannelsKey = "ARFCNs";
 constexpr EntryList::Layout kChannels{.start = 15, .stride = 2, .bytesRead = 2};
+constexpr Position kChannelNumber = u16At(0);
 
 constexpr auto kFields = std::to_array<Field>({
     {"HSN", u8At(13), Conversion::number()},
@@ -34,9 +37,18 @@ void MobileAllocation::updateWithData(const LogRecord& record, LogCode logCode) 
     }
     show(kFields, record);
     const EntryList channels(record, kChannels, record.u8(kCountOffset));
-    show("ARFCNs", channels.map([](const LogRecord& channel, std::size_t) {
-        return DisplayNumber(std::int64_t{channel.u16(0)}, kDecimal);
+    show(kChannelsKey, channels.map([](const LogRecord& channel, std::size_t) {
+        return DisplayNumber(std::int64_t{channel.u16(kChannelNumber.byte)}, kDecimal);
     }));
+}
+
+RecordDescription MobileAllocation::describe() const {
+    ListDescription list = describeList(kChannelsKey, kChannels, u8At(kCountOffset), {});
+    list.fields = {describeField({"", kChannelNumber, Conversion::number()})};
+    CodeDescription code{kMobileAllocationLogCode, kMinimumLength};
+    code.fields = describeFields(kFields);
+    code.lists = {std::move(list)};
+    return {std::move(code)};
 }
 
 } // namespace pallax

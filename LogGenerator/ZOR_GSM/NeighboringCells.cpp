@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/NeighboringCells.h"
 
 #include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "LogGenerator/ZOR_GSM/SharedLogCodes.h"
 #include "platform/SystemLog.h"
@@ -25,6 +26,7 @@ constexpr std::size_t kBsicInEntry = 2;
 
 constexpr std::string_view kARFCNKey = "ARFCN";
 constexpr std::string_view kRSSIKey = "RSSI";
+constexpr std::string_view kBSICKey = "BSIC";
 
 constexpr auto kNeighbourFields = std::to_array<Field>({
     {kARFCNKey, u16At(kArfcnInEntry), Conversion::number()},
@@ -84,7 +86,7 @@ void NeighboringCells::fillMeasuredCell(Dictionary& cell, const LogRecord& entry
     fillEntry(cell, kNeighbourFields, entry);
     const auto bsic = arfcnToBsic.find(entry.u16(kArfcnInEntry));
     if (bsic != arfcnToBsic.end()) {
-        cell.setFixed("BSIC", DisplayNumber(std::int64_t{bsic->second}, kDecimal));
+        cell.setFixed(kBSICKey, DisplayNumber(std::int64_t{bsic->second}, kDecimal));
     }
 }
 
@@ -107,6 +109,31 @@ void NeighboringCells::showMonitoredCells(const LogRecord& record) {
         replaceList(cellEntries(*cells, kHXCellMonitorRadioAccessTechnologyGSM,
                                 kHXCellMonitorCellTypeNeighbor, kCellNumbers, kCellLevels));
     }
+}
+
+RecordDescription NeighboringCells::describe() const {
+    ListDescription neighbours =
+        describeList("", kNeighbours, u8At(kNeighbourCountOffset), kNeighbourFields);
+    neighbours.fields.push_back(
+        describeComputed(kBSICKey, kDecimal, "bsic",
+                         "what the last record 0x51FF told for the ARFCN; no key if nothing",
+                         {extentOf(u16At(kArfcnInEntry))}));
+    CodeDescription measured{kMeasurementLogCode, kMeasurementLength};
+    measured.lists = {std::move(neighbours)};
+
+    const auto told = std::to_array<Field>({
+        {kARFCNKey, u16At(kArfcnInEntry), Conversion::number()},
+        {kBSICKey, u8At(kBsicInEntry), Conversion::number()},
+    });
+    CodeDescription bsics{kBsicListLogCode, kBsicListMinimumLength};
+    bsics.lists = {describeList("", kBsics, u8At(kBsicCountOffset), told)};
+    bsics.lists.front().isShown = false;
+    bsics.lists.front().rememberedAs = "bsic";
+    bsics.note = "Remembered for the lists to come; shows nothing itself.";
+
+    CodeDescription monitored = describeCells("each neighbour of GSM", kCellNumbers, kCellLevels);
+    monitored.listIsEntries = true;
+    return {std::move(measured), std::move(bsics), std::move(monitored)};
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/ProcessCO.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/MobilityStates.h"
 #include "platform/SystemLog.h"
 
@@ -26,6 +27,10 @@ std::span<const LogCode> ProcessCO::getLogCodeArray() const {
 void ProcessCO::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "ProcessCS"); // the line of its sibling, on purpose
     showGroup(kGroups, record, logCode);
+}
+
+RecordDescription ProcessCO::describe() const {
+    return describeGroups(kGroups);
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/ProcessCS.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/MobilityStates.h"
 #include "platform/SystemLog.h"
 
@@ -49,6 +50,10 @@ std::span<const LogCode> ProcessCS::getLogCodeArray() const {
 void ProcessCS::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "ProcessCS");
     showGroup(kGroups, record, logCode);
+}
+
+RecordDescription ProcessCS::describe() const {
+    return describeGroups(kGroups);
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/ProcessPS.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/MobilityStates.h"
 #include "platform/SystemLog.h"
 
@@ -64,6 +65,10 @@ std::span<const LogCode> ProcessPS::getLogCodeArray() const {
 void ProcessPS::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(LogPriority::Warning, "ProcessPS");
     showGroup(kGroups, record, logCode);
+}
+
+RecordDescription ProcessPS::describe() const {
+    return describeGroups(kGroups);
 }
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/ZOR_GSM/SearcherSet.h"
 
+#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <array>
@@ -11,7 +12,6 @@ namespace {
 constexpr LogCode kSearcherLogCode = 0x417A;
 constexpr auto kLogCodes = std::to_array<LogCode>({kSearcherLogCode});
 constexpr std::size_t kMinimumLength = 16;
-constexpr std::size_t kCellCountOffset = 15;
 
 } // namespace
 
@@ -39,6 +39,12 @@ void SearcherSet::updateWithData(const LogRecord& record, LogCode logCode) {
     if (cellCount(record) != 0) {
         replaceList(cellsOf(record));
     }
+}
+
+RecordDescription SearcherSet::describe() const {
+    CodeDescription code{kSearcherLogCode, kMinimumLength};
+    code.note = "Empties the list; none of the record's cells is shown.";
+    return {std::move(code)};
 }
 
 } // namespace pallax

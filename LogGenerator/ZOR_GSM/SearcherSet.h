@@ -18,6 +18,7 @@ public:
     std::span<const LogCode> getLogCodeArray() const final;
     SectionKind sectionKind() const final { return SectionKind::List; }
     void updateWithData(const LogRecord& record, LogCode logCode) final;
+    RecordDescription describe() const override;
 
 protected:
     /// `logLine` is logged on every call; it must live as long as the program.
@@ -31,6 +32,7 @@ protected:
 
     /// Of cell entry 0; the path records follow behind the last entry.
     static constexpr std::size_t kCellsStart = 16;
+    static constexpr std::size_t kCellCountOffset = 15;
 
 private:
     std::string_view _logLine;

@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/ServingPLMN.h"
 
 #include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/MobilityStates.h"
 #include "LogGenerator/ZOR_GSM/SharedLogCodes.h"
 #include "platform/SystemLog.h"
@@ -40,6 +41,11 @@ static_assert(kServiceTypes.size() == 5);
 constexpr auto kSelectionFields = std::to_array<Field>({
     {"PLMN Sel Mod", u8At(14), Conversion::label(kSelectionModes)},
 });
+
+/// The bytes of the two codes, a digit in each half.
+constexpr std::size_t kFirstDigits = 15;
+constexpr std::size_t kSecondDigits = 16;
+constexpr std::size_t kThirdDigits = 17;
 
 /// Behind the two codes, which are digits.
 constexpr auto kNetworkFields = std::to_array<Field>({
@@ -98,9 +104,9 @@ void ServingPLMN::updateWithData(const LogRecord& record, LogCode logCode) {
 }
 
 void ServingPLMN::showNetwork(const LogRecord& record) {
-    const std::uint8_t first = record.u8(15);
-    const std::uint8_t second = record.u8(16);
-    const std::uint8_t third = record.u8(17);
+    const std::uint8_t first = record.u8(kFirstDigits);
+    const std::uint8_t second = record.u8(kSecondDigits);
+    const std::uint8_t third = record.u8(kThirdDigits);
     show(kCountryCodeKey, std::string{lowDigit(first), highDigit(first), lowDigit(second)});
     show(kNetworkCodeKey, std::string{lowDigit(third), highDigit(third), highDigit(second)});
     show(kNetworkFields, record);
@@ -115,6 +121,35 @@ void ServingPLMN::showServingCell(const LogRecord& record) {
     if (cell != cells->end()) {
         showCellNumbers(sectionRef().dictionary(), kCellNumbers, *cell);
     }
+}
+
+RecordDescription ServingPLMN::describe() const {
+    CodeDescription network{kServingPLMNLogCode, kServingPLMNLength};
+    const auto digits = [](std::string_view key, std::string_view computation,
+                           std::string_view formula, std::vector<Extent> read) {
+        FieldDescription field{std::string(key)};
+        field.formula = formula;
+        field.computation = computation;
+        field.read = std::move(read);
+        return field;
+    };
+    network.fields = {
+        digits(kCountryCodeKey, "country code",
+               "three digits: low and high half of the first byte, low half of the second; a blank "
+               "for one above 9",
+               {{kFirstDigits}, {kSecondDigits}}),
+        digits(
+            kNetworkCodeKey, "network code",
+            "three digits: low and high half of the first byte, high half of the second; a blank "
+            "for one above 9",
+            {{kThirdDigits}, {kSecondDigits}})};
+    for (FieldDescription& field : describeFields(kNetworkFields)) {
+        network.fields.push_back(std::move(field));
+    }
+    CodeDescription selection{kRegistrationLogCode, kStateRecordLength};
+    selection.fields = describeFields(kSelectionFields);
+    return {std::move(network), std::move(selection),
+            describeCells("the first serving cell of GSM or UMTS", kCellNumbers, {})};
 }
 
 } // namespace pallax

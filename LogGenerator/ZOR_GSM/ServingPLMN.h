@@ -35,6 +35,7 @@ public:
     std::string_view getSectionName() const override { return "Serving PLMN"; }
     std::span<const LogCode> getLogCodeArray() const override;
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    RecordDescription describe() const override;
 
 private:
     void showNetwork(const LogRecord& record);

@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/UMTSRRInfo.h"
 
 #include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "platform/SystemLog.h"
 #include "platform/TelephonyConstants.h"
@@ -55,6 +56,7 @@ constexpr auto kCipheringFields = std::to_array<Field>({
     {"Ciphering", u8At(13), Conversion::flag("Enabled", "Disabled")},
 });
 
+constexpr std::string_view kTransmitPowerKey = "Transmit Power";
 constexpr NumberFormat kMeanDbm{"%4.2lf dBm"};
 constexpr std::size_t kPowerCountOffset = 14;
 constexpr EntryList::Layout kPowerEntries{16, 14, 6};
@@ -137,7 +139,7 @@ void UMTSRRInfo::updateCiphering(const LogRecord& record) {
 void UMTSRRInfo::updateTransmitPower(const LogRecord& record) {
     if (record.has(kTransmitPowerRecordLength)) {
         const EntryList entries(record, kPowerEntries, record.u8(kPowerCountOffset));
-        show("Transmit Power", DisplayNumber(meanTransmitPower_dbm(entries), kMeanDbm));
+        show(kTransmitPowerKey, DisplayNumber(meanTransmitPower_dbm(entries), kMeanDbm));
     }
 }
 
@@ -150,6 +152,33 @@ void UMTSRRInfo::updateFromCellMonitor(const LogRecord& record) {
                                             kHXCellMonitorCellTypeServing)) {
         showCellNumbers(sectionRef().dictionary(), kCellNumbers, *cell);
     }
+}
+
+RecordDescription UMTSRRInfo::describe() const {
+    CodeDescription state{kStateLogCode, kStateRecordLength};
+    state.fields = describeFields(kStateFields);
+
+    CodeDescription power{kTransmitPowerLogCode, kTransmitPowerRecordLength};
+    power.fields = {describeComputed(kTransmitPowerKey, kMeanDbm, "mean power",
+                                     "the mean of (v + 512) / 10 toward zero - 70 over the entries "
+                                     "whose raw power v is not 0; of none, it is no number",
+                                     {{kPowerCountOffset}})};
+    ListDescription entries = describeList("", kPowerEntries, u8At(kPowerCountOffset), {});
+    entries.fields = {describeField({"", s16At(kRawPowerOffset), Conversion::number()})};
+    entries.isShown = false;
+    power.lists = {std::move(entries)};
+
+    CodeDescription identity{kIdentityLogCode, kIdentityRecordLength};
+    identity.fields = describeFields(kIdentityFields);
+    for (FieldDescription& field : describeFields(kRegistrationAreaFields)) {
+        identity.fields.push_back(std::move(field));
+    }
+    identity.note = "Removes \"UARFCN\", which is of the cell before.";
+
+    CodeDescription ciphering{kCipheringLogCode, kCipheringRecordLength};
+    ciphering.fields = describeFields(kCipheringFields);
+    return {std::move(state), std::move(power), std::move(identity), std::move(ciphering),
+            describeCells("the first serving cell of UMTS", kCellNumbers, {})};
 }
 
 } // namespace pallax

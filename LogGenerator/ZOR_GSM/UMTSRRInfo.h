@@ -38,6 +38,7 @@ public:
     std::string_view getSectionName() const override { return "UMTS RR Info"; }
     std::span<const LogCode> getLogCodeArray() const override;
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    RecordDescription describe() const override;
 
 private:
     void updateState(const LogRecord& record);

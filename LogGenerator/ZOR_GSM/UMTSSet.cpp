@@ -1,6 +1,7 @@
 #include "LogGenerator/ZOR_GSM/UMTSSet.h"
 
 #include "LogGenerator/Common/CellMonitor.h"
+#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/EntryList.h"
 #include "LogGenerator/ZOR_GSM/RankingRecord.h"
 #include "platform/SystemLog.h"
@@ -83,6 +84,15 @@ void UMTSSet::updateFromCellMonitor(const LogRecord& record) {
     }
     replaceList(cellEntries(*cells, kHXCellMonitorRadioAccessTechnologyUMTS,
                             kHXCellMonitorCellTypeNeighbor, kCellNumbers, kCellLevels));
+}
+
+RecordDescription UMTSSet::describe() const {
+    CodeDescription ranking{kRankingLogCode, kRankingRecordLength};
+    ranking.lists = {describeList("", {kRankingEntriesStart, kEntryLength, kEntryLength},
+                                  u8At(kCountOffset), kEntryFields)};
+    CodeDescription monitored = describeCells("each neighbour of UMTS", kCellNumbers, kCellLevels);
+    monitored.listIsEntries = true;
+    return {std::move(ranking), std::move(monitored)};
 }
 
 } // namespace pallax

@@ -1,0 +1,40 @@
+#pragma once
+
+#include "reference/Reference.h"
+
+#include <string>
+#include <vector>
+
+/// What documents say about a section, in words and rows: the same for the manual page and for the
+/// tables of docs/records, without the marks of either.
+namespace pallax {
+
+struct ReferenceRow {
+    std::string place; ///< bytes, or the key of a property list
+    std::string bits;
+    std::string key; ///< empty for a list of plain values
+    std::string shown;
+    std::string unit;
+    std::string meaning;
+};
+
+/// The fields of a record, of the entries of a list, or of a subpacket.
+struct ReferenceTable {
+    std::string heading;  ///< empty for the record itself
+    std::string sentence; ///< how the entries lie; may be empty
+    std::vector<ReferenceRow> rows;
+};
+
+struct CodeText {
+    std::string title; ///< "0xB17F, Idle-mode measurement of the serving cell"
+    std::string demands;
+    std::vector<ReferenceTable> tables;
+};
+
+CodeText textOf(const TechnologyReference& technology, const SectionReference& section,
+                const CodeDescription& code);
+
+/// Of IFX: the keys and what they tell.
+ReferenceTable objectTable(const TechnologyReference& technology, const SectionReference& section);
+
+} // namespace pallax

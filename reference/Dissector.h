@@ -1,0 +1,15 @@
+#pragma once
+
+#include "reference/Reference.h"
+
+#include <span>
+#include <string>
+
+namespace pallax {
+
+/// The protocol analyser's dissector: the tables of all technologies, and behind them `program`,
+/// which walks them.
+std::string dissector(std::span<const TechnologyReference> technologies,
+                      const std::string& program);
+
+} // namespace pallax

@@ -1,0 +1,18 @@
+#pragma once
+
+#include "reference/Reference.h"
+
+#include <string>
+#include <vector>
+
+/// The parts of a description as Lua tables; what has its usual value is left out.
+namespace pallax {
+
+std::string luaPosition(const Position& position);
+std::string luaCondition(const Condition& condition);
+/// `filter` is the field's name in filters.
+std::string luaField(const FieldDescription& field, const std::string& filter);
+/// How a list lies and what goes for its entries, without its fields and lists.
+std::string luaLayout(const ListDescription& list);
+
+} // namespace pallax

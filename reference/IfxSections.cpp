@@ -1,0 +1,23 @@
+#include "reference/IfxSections.h"
+
+namespace pallax {
+
+std::vector<SectionReference> ifxSections() {
+    const auto keys = [](std::string name, std::vector<std::string> objectKeys) {
+        return SectionReference{std::move(name), false, {}, std::move(objectKeys)};
+    };
+    const auto list = [](std::string name, std::vector<std::string> objectKeys) {
+        return SectionReference{std::move(name), true, {}, std::move(objectKeys)};
+    };
+    return {
+        keys("Network", {"Name", "MCC", "MNC"}),
+        keys("RR", {}),
+        keys("Serving Cell", {"ARFCN", "BSIC", "Rx Level", "C1", "Area", "LAC", "Cell ID"}),
+        list("Neighbour Cells", {"ARFCN", "BSIC", "Rx Level"}),
+        keys("Dedicated Channel",
+             {"Channel", "Time Slot", "Timing Advance", "Rx Quality", "Tx Power", "Hopping"}),
+        list("Barred Cells", {}),
+    };
+}
+
+} // namespace pallax

@@ -1,0 +1,37 @@
+#pragma once
+
+#include "LogGenerator/Records/LogCode.h"
+
+#include <span>
+#include <string_view>
+
+namespace pallax {
+
+/// What a display key tells, in one sentence; with an empty key, what its section tells. The keys
+/// of a list within a section belong to the section, too.
+struct Meaning {
+    std::string_view section; ///< of CDMA: the path in the template, "1x / Receiver 0"
+    std::string_view key;
+    std::string_view sentence;
+};
+
+/// What a log code is called.
+struct CodeName {
+    LogCode logCode;
+    std::string_view name;
+};
+
+struct Meanings {
+    std::span<const Meaning> keys;
+    std::span<const CodeName> codes;
+};
+
+Meanings cdmaMeanings();
+/// Of the sections and codes that several technologies have.
+Meanings commonMeanings();
+Meanings gsmMeanings();
+Meanings ifxMeanings();
+Meanings lteMeanings();
+Meanings utranMeanings();
+
+} // namespace pallax

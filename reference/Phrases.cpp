@@ -1,0 +1,266 @@
+#include "reference/Phrases.h"
+
+#include "platform/Format.h"
+
+#include <array>
+#include <charconv>
+
+namespace pallax {
+
+namespace {
+
+constexpr unsigned kByteBits = 8;
+constexpr std::int64_t kLargestByte = 255;
+
+std::string quoted(std::string_view text) {
+    std::string result("\"");
+    result.append(text).append("\"");
+    return result;
+}
+
+/// "raw x 0.25 - 140"
+std::string scaledOf(const ShownAs& shownAs) {
+    std::string text("raw");
+    if (shownAs.factor != 1.0) {
+        text.append(" x ").append(decimal(shownAs.factor));
+    }
+    if (shownAs.offset != 0.0) {
+        text.append(shownAs.offset < 0.0 ? " - " : " + ")
+            .append(decimal(shownAs.offset < 0.0 ? -shownAs.offset : shownAs.offset));
+    }
+    return text;
+}
+
+std::string numberOf(const ShownAs& shownAs) {
+    const std::string scaled = scaledOf(shownAs);
+    const std::string format = printfText(*shownAs.format);
+    if (scaled == "raw") {
+        return format == "%d" || format == "%u" ? "number" : "number as " + quoted(format);
+    }
+    return scaled + ", as " + quoted(format);
+}
+
+std::string labelsOf(const ShownAs& shownAs) {
+    std::string text;
+    for (std::size_t index = 0; index < shownAs.labels.size(); ++index) {
+        const bool beyond =
+            shownAs.beyondFormat == nullptr && shownAs.labels[index] == shownAs.beyond;
+        if (!beyond) {
+            const auto raw = static_cast<std::uint8_t>(index - shownAs.shift);
+            text.append(text.empty() ? "" : ", ").append(std::to_string(raw)).append(" ");
+            text.append(quoted(shownAs.labels[index]));
+        }
+    }
+    return text + "; otherwise " +
+           quoted(shownAs.beyondFormat != nullptr ? printfText(*shownAs.beyondFormat)
+                                                  : std::string(shownAs.beyond));
+}
+
+/// "byte 36 is 4 or more"
+std::string inWords(const Condition& condition) {
+    std::string text = inWords(condition.position);
+    if (condition.subpacket) {
+        text += " of subpacket " + std::to_string(*condition.subpacket);
+    }
+    text +=
+        condition.position.width == kByteBits || condition.position.width == 1 ? " is " : " are ";
+    text += std::to_string(condition.least);
+    if (condition.most == kLargestByte) {
+        return text + " or more";
+    }
+    return condition.most == condition.least ? text
+                                             : text + " to " + std::to_string(condition.most);
+}
+
+std::string exceptionOf(const ShownAs& shownAs) {
+    if (!shownAs.exceptional) {
+        return "";
+    }
+    const std::string text =
+        shownAs.exceptionalText.empty() ? "nothing" : quoted(shownAs.exceptionalText);
+    return "; " + text + " for " + std::to_string(*shownAs.exceptional);
+}
+
+std::string conditionOf(const FieldDescription& field) {
+    if (!field.condition) {
+        return "";
+    }
+    const std::string condition = inWords(*field.condition);
+    return field.condition->otherwise.empty()
+               ? "; only if " + condition
+               : "; " + quoted(field.condition->otherwise) + " unless " + condition;
+}
+
+std::string valueOf(const FieldDescription& field) {
+    const ShownAs& shownAs = field.shownAs;
+    if (!field.formula.empty()) {
+        return std::string(field.formula) +
+               (shownAs.format != nullptr ? ", as " + quoted(printfText(*shownAs.format)) : "");
+    }
+    if (shownAs.format != nullptr) {
+        return numberOf(shownAs);
+    }
+    if (!field.position) {
+        return "as it comes";
+    }
+    return shownAs.labels.empty() ? quoted(shownAs.beyond) : labelsOf(shownAs);
+}
+
+std::string placeOf(const Extent& extent) {
+    std::string text = std::to_string(extent.byte);
+    if (extent.length > 1) {
+        text += "-" + std::to_string(extent.byte + extent.length - 1);
+    }
+    switch (extent.origin) {
+    case Extent::Origin::Record:
+        return text + " of the record";
+    case Extent::Origin::Companion:
+        return text + " of the companion";
+    case Extent::Origin::Here:
+        break;
+    }
+    return text;
+}
+
+/// "from byte 29 on, further behind by 6 for each unit of byte 27, every 14 bytes"
+std::string inWords(const EntryRun& run) {
+    std::string text = "from byte " + std::to_string(run.layout.start) + " on";
+    if (run.move) {
+        text += ", further behind by " + std::to_string(run.move->bytes) + " for each unit of " +
+                inWords(run.move->count);
+    }
+    return text + ", every " + std::to_string(run.layout.stride) +
+           (run.layout.stride == 1 ? " byte" : " bytes");
+}
+
+std::string countOf(const ListDescription& list) {
+    if (!list.count) {
+        return std::to_string(list.plus) + " entries";
+    }
+    return "As many entries as " + inWords(*list.count) +
+           (list.count->width == kByteBits ? " tells" : " tell") +
+           (list.plus != 0 ? ", and " + std::to_string(list.plus) + " more" : "");
+}
+
+} // namespace
+
+std::string printfText(const NumberFormat& format) {
+    const NumberConversion& conversion = format.conversion();
+    std::string text(format.prefix());
+    text.append("%");
+    text.append(conversion.leftAlign ? "-" : "").append(conversion.plusSign ? "+" : "");
+    text.append(conversion.zeroPad ? "0" : "").append(conversion.blankSign ? " " : "");
+    text.append(conversion.alternate ? "#" : "");
+    if (conversion.width != 0) {
+        text.append(std::to_string(conversion.width));
+    }
+    if (conversion.precision >= 0) {
+        text.append(".").append(std::to_string(conversion.precision));
+    }
+    text.push_back(conversion.conversion);
+    return text.append(format.suffix());
+}
+
+std::string hexadecimal(LogCode logCode) {
+    return formatText("0x%04X", {logCode});
+}
+
+std::string decimal(double number) {
+    std::array<char, 32> buffer{};
+    const auto end = std::to_chars(buffer.data(), buffer.data() + buffer.size(), number).ptr;
+    return {buffer.data(), end};
+}
+
+std::string inWords(const Position& position) {
+    const std::string byte = "byte " + std::to_string(position.byte);
+    if (position.bit == 0 && position.width == kByteBits) {
+        return byte;
+    }
+    if (position.width == 1) {
+        return "bit " + std::to_string(position.bit) + " of " + byte;
+    }
+    const std::string width = "the " + std::to_string(position.width) + " bits ";
+    return position.bit == 0 ? width + "at " + byte
+                             : width + "from bit " + std::to_string(position.bit) + " of " + byte;
+}
+
+std::string placeOf(const FieldDescription& field) {
+    if (!field.listKey.empty()) {
+        return std::string(field.listKey);
+    }
+    if (field.position) {
+        return placeOf(extentOf(*field.position));
+    }
+    std::string text;
+    for (const Extent& extent : field.read) {
+        text.append(text.empty() ? "" : ", ").append(placeOf(extent));
+    }
+    return text;
+}
+
+std::string bitsOf(const FieldDescription& field) {
+    if (!field.position) {
+        return "";
+    }
+    const Position& position = *field.position;
+    std::string text = std::to_string(position.width);
+    if (position.bit != 0 || position.width % kByteBits != 0) {
+        text += " from bit " + std::to_string(position.bit);
+    }
+    text.append(position.isSigned ? ", signed" : "");
+    text.append(position.bigEndian ? ", high byte first" : "");
+    return text;
+}
+
+std::string shownOf(const FieldDescription& field) {
+    return valueOf(field) + exceptionOf(field.shownAs) + conditionOf(field);
+}
+
+std::string unitOf(const FieldDescription& field) {
+    return field.shownAs.format != nullptr ? std::string(field.shownAs.format->unit()) : "";
+}
+
+std::string layoutOf(const ListDescription& list) {
+    std::string text = countOf(list);
+    text += list.formula.empty() ? ", " + inWords(list.entries) + "."
+                                 : "; " + std::string(list.formula) + ".";
+    if (list.companion) {
+        text += " Each has a companion, " + inWords(*list.companion) + ".";
+    }
+    if (list.entryName) {
+        text += " An entry is named by " + inWords(*list.entryName) + ".";
+    }
+    if (list.only) {
+        text += " Shown are those of which " + inWords(*list.only) + ".";
+    }
+    if (list.fit == ListDescription::Fit::AllOrNothing) {
+        text += " All must lie inside the record.";
+    } else if (list.fit == ListDescription::Fit::Exact) {
+        text += " The record must end with the last one.";
+    }
+    if (!list.ifEmpty.empty()) {
+        text += " Without entries " + quoted(list.ifEmpty) + ".";
+    }
+    text += list.staysWithoutEntries ? " Without entries the list stays as it was." : "";
+    return text + (list.isShown ? "" : " They are not shown.");
+}
+
+std::string demandsOf(const CodeDescription& code) {
+    std::string text;
+    if (!code.listPart.empty()) {
+        text = "A property list from byte " + std::to_string(LogRecord::kHeaderLength) +
+               " on: " + std::string(code.listPart) + ".";
+    } else {
+        text = (code.exactLength ? "Exactly " : "At least ") + std::to_string(code.minimumLength) +
+               " bytes.";
+    }
+    if (code.condition) {
+        text += " Only if " + inWords(*code.condition) + ".";
+    }
+    if (!code.note.empty()) {
+        text += " " + std::string(code.note);
+    }
+    return text;
+}
+
+} // namespace pallax

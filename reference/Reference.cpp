@@ -1,0 +1,212 @@
+#include "reference/Reference.h"
+
+#include "LogGenerator/C2K/C2KLogGenerator.h"
+#include "LogGenerator/LTE/LTEClassIndex.h"
+#include "LogGenerator/UTRAN/UTRANClassIndex.h"
+#include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
+#include "host/Recording.h"
+#include "reference/IfxSections.h"
+
+#include <algorithm>
+#include <map>
+#include <set>
+#include <stdexcept>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+/// A class index prints that it ends; nobody wants to know here.
+class NoOutput final : public StandardOutput {
+public:
+    void printLine(std::string_view /*line*/) override {}
+};
+
+DictionaryRef templateNamed(const Resources& resources, std::string_view name) {
+    const auto loaded = resources.propertyList(name);
+    DictionaryRef entries = loaded ? loaded->dictionary() : nullptr;
+    if (entries == nullptr) {
+        throw std::runtime_error("the template " + std::string(name) + " cannot be read");
+    }
+    return entries;
+}
+
+/// The sections of the records, in the order of the template, whatever stands around them.
+void appendSections(const Dictionary& entries, const ClassIndex& index,
+                    std::vector<SectionReference>& sections) {
+    for (const Dictionary::Entry& entry : entries) {
+        if (const Base* record = index.getClass(entry.key.view())) {
+            sections.push_back({std::string(record->getSectionName()),
+                                record->sectionKind() == SectionKind::List, record->describe()});
+        } else if (const DictionaryRef inner = entry.value.dictionary()) {
+            appendSections(*inner, index, sections);
+        }
+    }
+}
+
+template <class Index>
+std::vector<SectionReference> recordSections(const Resources& resources,
+                                             std::string_view templateName) {
+    NoOutput output;
+    const Index index(output);
+    std::vector<SectionReference> sections;
+    appendSections(*templateNamed(resources, templateName), index, sections);
+    return sections;
+}
+
+std::vector<SectionReference> gsmSections(const Resources& resources) {
+    return recordSections<ZOR_GSMClassIndex>(resources, "ZOR_GSM");
+}
+
+std::vector<SectionReference> lteSections(const Resources& resources) {
+    return recordSections<LTEClassIndex>(resources, "LTE");
+}
+
+std::vector<SectionReference> utranSections(const Resources& resources) {
+    return recordSections<UTRANClassIndex>(resources, "UTRAN");
+}
+
+/// Lookup name to the keys of one section that show it.
+using Places = std::multimap<std::string, std::string>;
+
+/// Those that the section shows, under its keys.
+template <class Described>
+std::vector<Described> shownIn(const Places& places, const std::vector<Described>& all) {
+    std::vector<Described> shown;
+    for (const Described& each : all) {
+        const auto [first, last] = places.equal_range(each.key);
+        for (auto place = first; place != last; ++place) {
+            shown.push_back(each);
+            shown.back().key = place->second;
+        }
+    }
+    return shown;
+}
+
+/// What of a code the section shows; nothing when that is nothing.
+std::optional<CodeDescription> shownIn(const Places& places, const CodeDescription& code) {
+    CodeDescription shown = code;
+    shown.fields = shownIn(places, code.fields);
+    shown.lists = shownIn(places, code.lists);
+    bool any = !shown.fields.empty() || !shown.lists.empty();
+    for (SubpacketDescription& subpacket : shown.subpackets) {
+        subpacket.fields = shownIn(places, subpacket.fields);
+        subpacket.lists = shownIn(places, subpacket.lists);
+        any = any || !subpacket.fields.empty() || !subpacket.lists.empty();
+    }
+    return any ? std::optional(std::move(shown)) : std::nullopt;
+}
+
+/// A section for each dictionary of the template that shows a lookup name.
+void appendPlaces(const Dictionary& entries, const std::string& path,
+                  const std::vector<CodeDescription>& codes,
+                  std::vector<SectionReference>& sections) {
+    Places places;
+    for (const Dictionary::Entry& entry : entries) {
+        if (const auto lookupName = entry.value.string()) {
+            places.emplace(*lookupName, entry.key.string());
+        }
+    }
+    if (!places.empty()) {
+        SectionReference section{path};
+        for (const CodeDescription& code : codes) {
+            if (auto shown = shownIn(places, code)) {
+                section.codes.push_back(std::move(*shown));
+            }
+        }
+        sections.push_back(std::move(section));
+    }
+    for (const Dictionary::Entry& entry : entries) {
+        if (const DictionaryRef inner = entry.value.dictionary()) {
+            const std::string key = entry.key.string();
+            appendPlaces(*inner, path.empty() ? key : path + " / " + key, codes, sections);
+        }
+    }
+}
+
+std::vector<SectionReference> cdmaSections(const Resources& resources) {
+    std::vector<SectionReference> sections;
+    appendPlaces(*templateNamed(resources, "C2KTemplate"), "", C2KLogGenerator::describe(),
+                 sections);
+    return sections;
+}
+
+std::vector<SectionReference> ifxSectionsOf(const Resources& /*resources*/) {
+    return ifxSections();
+}
+
+struct Source {
+    std::string_view commandName;
+    std::string_view title;
+    std::vector<SectionReference> (*sections)(const Resources& resources);
+    Meanings (*meanings)();
+};
+
+constexpr auto kSources = std::to_array<Source>({
+    {"ifx", "IFX", ifxSectionsOf, ifxMeanings},
+    {"gsm", "GSM/UMTS", gsmSections, gsmMeanings},
+    {"cdma", "CDMA", cdmaSections, cdmaMeanings},
+    {"lte", "LTE", lteSections, lteMeanings},
+    {"utran", "UTRAN", utranSections, utranMeanings},
+});
+
+const Source& sourceOf(std::string_view commandName) {
+    return *std::find_if(kSources.begin(), kSources.end(), [commandName](const Source& source) {
+        return source.commandName == commandName;
+    });
+}
+
+std::string_view sentenceOf(const Meanings& meanings, std::string_view section,
+                            std::string_view key) {
+    const auto found =
+        std::find_if(meanings.keys.begin(), meanings.keys.end(), [&](const Meaning& meaning) {
+            return meaning.section == section && meaning.key == key;
+        });
+    return found != meanings.keys.end() ? found->sentence : std::string_view();
+}
+
+std::string_view nameIn(const Meanings& meanings, LogCode logCode) {
+    const auto found =
+        std::find_if(meanings.codes.begin(), meanings.codes.end(),
+                     [logCode](const CodeName& each) { return each.logCode == logCode; });
+    return found != meanings.codes.end() ? found->name : std::string_view();
+}
+
+} // namespace
+
+std::vector<TechnologyReference> gatherReference(const Resources& resources) {
+    std::vector<TechnologyReference> technologies;
+    for (const RecordedTechnology& technology : recordedTechnologies()) {
+        const Source& source = sourceOf(technology.commandName);
+        technologies.push_back({&technology, source.title, source.sections(resources)});
+    }
+    return technologies;
+}
+
+Meanings meaningsOf(const TechnologyReference& technology) {
+    return sourceOf(technology.technology->commandName).meanings();
+}
+
+std::string_view TechnologyReference::meaningOf(std::string_view section,
+                                                std::string_view key) const {
+    const std::string_view own = sentenceOf(meaningsOf(*this), section, key);
+    return !own.empty() ? own : sentenceOf(commonMeanings(), section, key);
+}
+
+std::string_view TechnologyReference::nameOf(LogCode logCode) const {
+    const std::string_view own = nameIn(meaningsOf(*this), logCode);
+    return !own.empty() ? own : nameIn(commonMeanings(), logCode);
+}
+
+std::vector<LogCode> codesOf(const TechnologyReference& technology) {
+    std::set<LogCode> codes;
+    for (const SectionReference& section : technology.sections) {
+        for (const CodeDescription& code : section.codes) {
+            codes.insert(code.logCode);
+        }
+    }
+    return {codes.begin(), codes.end()};
+}
+
+} // namespace pallax

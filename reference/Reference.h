@@ -1,0 +1,47 @@
+#pragma once
+
+#include "LogGenerator/Records/Description.h"
+#include "platform/Resources.h"
+#include "reference/Meanings.h"
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace pallax {
+
+struct RecordedTechnology;
+
+/// One section of a technology's display, and what fills it.
+struct SectionReference {
+    std::string name; ///< of CDMA: the path in the template, "1x / Receiver 0"
+    bool isList = false;
+    /// Every log code that the section's record subscribes to, also one that shows nothing. The
+    /// keys are display keys, of CDMA as well.
+    std::vector<CodeDescription> codes = {};
+    /// IFX: the keys, which no log code carries.
+    std::vector<std::string> objectKeys = {};
+};
+
+struct TechnologyReference {
+    const RecordedTechnology* technology; ///< link type and names
+    std::string_view title;               ///< "GSM/UMTS"
+    std::vector<SectionReference> sections;
+
+    /// The sentence of a key, or of the section with an empty key; empty where there is none.
+    std::string_view meaningOf(std::string_view section, std::string_view key) const;
+    /// What a log code is called; empty where there is none.
+    std::string_view nameOf(LogCode logCode) const;
+};
+
+/// The descriptions of all technologies, by link type; the sections stand in the order of the
+/// templates, which `resources` holds.
+std::vector<TechnologyReference> gatherReference(const Resources& resources);
+
+/// The sentences of a technology, without those that several have in common.
+Meanings meaningsOf(const TechnologyReference& technology);
+
+/// The codes of a technology that some section reads, ascending, each once.
+std::vector<LogCode> codesOf(const TechnologyReference& technology);
+
+} // namespace pallax

@@ -1,0 +1,144 @@
+#include "reference/SectionsPage.h"
+
+#include "host/Recording.h"
+#include "platform/Format.h"
+#include "platform/Utf8.h"
+#include "reference/CodeText.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kDescription = R"(.SH DESCRIPTION
+The display of a radio modem is made of sections, and a section of keys or of a list whose entries
+have keys.
+This page tells, for each technology, which log codes fill a section, where in the log record each key
+stands, how it is shown, and what it means.
+.PP
+A record is counted from its log type, byte 0, so that its body begins at byte 13; an entry of a list
+and a subpacket are counted from their own first byte.
+Numbers are unsigned and little\-endian unless it says otherwise; bit 0 is the lowest of a byte.
+\(lqraw\(rq is the number as it stands in the record; what stands in quotes is a label, or a format of
+.BR printf (3).
+Bytes beyond the end of a record read as zero, and a list ends at the first entry that is not whole.
+)";
+
+/// The text as roff shows it again: hyphens stay what is typed, nothing is a request.
+std::string escaped(std::string_view text) {
+    std::string result;
+    for (std::size_t at = 0; at < text.size(); ++at) {
+        const char character = text[at];
+        if (const Utf8CodePoint codePoint = utf8At(text, at); codePoint.size > 1) {
+            result += formatText("\\[u%04X]", {static_cast<std::uint32_t>(codePoint.value)});
+            at += codePoint.size - 1;
+            continue;
+        }
+        switch (character) {
+        case '\\':
+            result.append("\\e");
+            break;
+        case '-':
+            result.append("\\-");
+            break;
+        case '"':
+            result.append("\\(dq");
+            break;
+        case '\'':
+            result.append("\\(aq");
+            break;
+        case '^':
+            result.append("\\(ha");
+            break;
+        case '~':
+            result.append("\\(ti");
+            break;
+        default:
+            result.push_back(character);
+        }
+    }
+    // Roff takes a line that begins so for a request.
+    return result.starts_with('.') ? "\\&" + result : result;
+}
+
+std::string bold(std::string_view text) {
+    return "\\fB" + escaped(text) + "\\fR";
+}
+
+/// ", 9 bits from bit 1" of "9 from bit 1"
+std::string bitsIn(const std::string& bits) {
+    if (bits.empty()) {
+        return "";
+    }
+    const std::size_t width = bits.find_first_not_of("0123456789");
+    return ", " + bits.substr(0, width) +
+           (bits == "1" || bits.starts_with("1 ") ? " bit" : " bits") +
+           (width != std::string::npos ? bits.substr(width) : "");
+}
+
+std::string itemOf(const ReferenceRow& row) {
+    std::string text = ".TP\n" + bold(row.key.empty() ? "value" : row.key) + "\n";
+    if (!row.place.empty()) {
+        const bool isKey = row.place.front() == 'k';
+        text += escaped((isKey ? "Key " : "Byte ") + row.place) + bitsIn(row.bits) + ": ";
+    }
+    text += row.shown.empty() ? "" : escaped(row.shown) + ".\n";
+    text += row.unit.empty() ? "" : "Unit: " + escaped(row.unit) + ".\n";
+    return text + escaped(row.meaning) + (row.meaning.empty() ? "" : "\n");
+}
+
+std::string tableOf(const ReferenceTable& table) {
+    std::string text;
+    if (!table.heading.empty()) {
+        text += ".PP\n\\fI" + escaped(table.heading) + "\\fR.\n";
+        text += table.sentence.empty() ? "" : escaped(table.sentence) + "\n";
+    }
+    for (const ReferenceRow& row : table.rows) {
+        text += itemOf(row);
+    }
+    return text;
+}
+
+std::string sectionOf(const TechnologyReference& technology, const SectionReference& section) {
+    std::string text = ".SS " + escaped(std::string(technology.title) + ": " + section.name) +
+                       "\n" + escaped(technology.meaningOf(section.name, "")) +
+                       (section.isList ? "\nA list.\n" : "\n");
+    for (const CodeDescription& code : section.codes) {
+        const CodeText words = textOf(technology, section, code);
+        text += ".PP\n" + bold(words.title) + ".\n" + escaped(words.demands) + "\n";
+        for (const ReferenceTable& table : words.tables) {
+            text += tableOf(table);
+        }
+    }
+    return text + tableOf(objectTable(technology, section));
+}
+
+std::string headingOf(const TechnologyReference& technology) {
+    return ".SH " + escaped(technology.title) + "\nLink type " +
+           std::to_string(technology.technology->linkType) + ", on the command line " +
+           bold(technology.technology->commandName) + ".\n";
+}
+
+} // namespace
+
+std::string sectionsPage(std::span<const TechnologyReference> technologies) {
+    std::string text(".\\\" Written by make_reference.\n"
+                     ".TH PALLAX\\-SECTIONS 7 " PALLAX_DATE " \"pallax " PALLAX_VERSION
+                     "\" Pallax\n.SH NAME\npallax\\-sections \\- the sections of the display, and "
+                     "what they are read from\n");
+    text.append(kDescription);
+    for (const TechnologyReference& technology : technologies) {
+        text += headingOf(technology);
+        if (technology.technology->commandName == "ifx") {
+            text += "An IFX modem sends no log records: the display is whatever comes.\nThese "
+                    "sections and keys are known to come; every value is a text as the modem gives "
+                    "it.\n";
+        }
+        for (const SectionReference& section : technology.sections) {
+            text += sectionOf(technology, section);
+        }
+    }
+    return text + ".SH SEE ALSO\n.BR pallax (1),\n.BR pallax\\-decode (1),\n"
+                  ".BR pallax\\-recording (7)\n";
+}
+
+} // namespace pallax

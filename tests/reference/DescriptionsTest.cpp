@@ -1,0 +1,144 @@
+#include "LogGenerator/C2K/C2KLogGenerator.h"
+#include "LogGenerator/LTE/LTEClassIndex.h"
+#include "LogGenerator/UTRAN/UTRANClassIndex.h"
+#include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
+#include "reference/SectionsPage.h"
+#include "tests/doubles/C2KLookupNames.h"
+#include "tests/doubles/FakeStandardOutput.h"
+#include "tests/reference/ReferenceFixture.h"
+
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <fstream>
+#include <iterator>
+
+namespace pallax {
+namespace {
+
+template <class Index>
+class RecordDescriptions : public testing::Test {};
+using Indexes = testing::Types<LTEClassIndex, UTRANClassIndex, ZOR_GSMClassIndex>;
+TYPED_TEST_SUITE(RecordDescriptions, Indexes);
+
+TYPED_TEST(RecordDescriptions, EveryRecordDescribesTheCodesThatItWants) {
+    doubles::FakeStandardOutput output;
+    const TypeParam index(output);
+    for (const auto& [section, record] : index.classes()) {
+        std::vector<LogCode> described;
+        for (const CodeDescription& code : record->describe()) {
+            described.push_back(code.logCode);
+        }
+        const auto wanted = record->getLogCodeArray();
+        EXPECT_THAT(described, testing::UnorderedElementsAreArray(wanted.begin(), wanted.end()))
+            << section;
+    }
+}
+
+TYPED_TEST(RecordDescriptions, WhatIsReadBehindNoConditionLiesWithinTheLeastLength) {
+    doubles::FakeStandardOutput output;
+    const TypeParam index(output);
+    for (const auto& [section, record] : index.classes()) {
+        for (const CodeDescription& code : record->describe()) {
+            for (const FieldDescription& field : code.fields) {
+                if (field.position && !field.condition) {
+                    const Extent extent = extentOf(*field.position);
+                    EXPECT_LE(extent.byte + extent.length, code.minimumLength)
+                        << section << ", " << field.key;
+                }
+            }
+        }
+    }
+}
+
+TEST(Descriptions, EveryFieldTellsWhereItComesFrom) {
+    for (const TechnologyReference& technology : doubles::reference()) {
+        for (const SectionReference& section : technology.sections) {
+            for (const CodeDescription& code : section.codes) {
+                for (const FieldDescription& field : code.fields) {
+                    const int sources = (field.position ? 1 : 0) + (field.listKey.empty() ? 0 : 1) +
+                                        (field.formula.empty() ? 0 : 1);
+                    EXPECT_EQ(sources, 1) << section.name << ", " << field.key;
+                    EXPECT_EQ(field.formula.empty(), field.computation.empty()) << field.key;
+                    EXPECT_EQ(field.formula.empty(), field.read.empty()) << field.key;
+                }
+            }
+        }
+    }
+}
+
+TEST(Descriptions, TheParsersOfCdmaDescribeEveryLookupName) {
+    std::set<std::string> described;
+    for (const CodeDescription& code : C2KLogGenerator::describe()) {
+        described.merge(doubles::keysOf(code, true));
+    }
+    EXPECT_THAT(described, testing::UnorderedElementsAreArray(doubles::kLookupNames));
+}
+
+TEST(Descriptions, EveryComputationIsOneOfTheDissectors) {
+    std::ifstream file(PALLAX_SOURCE_DIR "/reference/dissector.lua");
+    const std::string program{std::istreambuf_iterator<char>(file), {}};
+    const auto expectIn = [&program](const std::vector<FieldDescription>& fields) {
+        for (const FieldDescription& field : fields) {
+            const std::string function =
+                "computations[\"" + std::string(field.computation) + "\"] = function";
+            EXPECT_TRUE(field.computation.empty() || field.computation == "scaled energy" ||
+                        program.find(function) != std::string::npos)
+                << function;
+        }
+    };
+    for (const TechnologyReference& technology : doubles::reference()) {
+        for (const SectionReference& section : technology.sections) {
+            for (const CodeDescription& code : section.codes) {
+                expectIn(code.fields);
+                for (const SubpacketDescription& subpacket : code.subpackets) {
+                    expectIn(subpacket.fields);
+                }
+                doubles::forEachList(code,
+                                     [&](const ListDescription& list) { expectIn(list.fields); });
+            }
+        }
+    }
+}
+
+/// The page's text without roff's marks.
+std::string plain(std::string page) {
+    for (const auto& [mark, text] : std::map<std::string, std::string>{
+             {"\\fB", ""}, {"\\fR", ""}, {"\\fI", ""}, {"\\-", "-"}, {"\\(aq", "'"}}) {
+        for (std::size_t at = page.find(mark); at != std::string::npos; at = page.find(mark, at)) {
+            page.replace(at, mark.size(), text);
+        }
+    }
+    return page;
+}
+
+TEST(SectionsPage, HoldsEverySectionWithEveryKeyAndItsMeaning) {
+    const std::vector<TechnologyReference> technologies = doubles::reference();
+    const std::string page = plain(sectionsPage(technologies));
+    for (const TechnologyReference& technology : technologies) {
+        const std::size_t start = page.find("\n.SH " + std::string(technology.title) + "\n");
+        ASSERT_NE(start, std::string::npos) << technology.title;
+        const std::string chapter = page.substr(start, page.find("\n.SH ", start + 1) - start);
+        for (const auto& [section, keys] : doubles::shownKeys(technology)) {
+            const std::size_t heading =
+                chapter.find(".SS " + std::string(technology.title) + ": " + section + "\n");
+            ASSERT_NE(heading, std::string::npos) << section;
+            const std::string part =
+                chapter.substr(heading, chapter.find(".SS ", heading + 1) - heading);
+            for (const std::string& key : keys) {
+                EXPECT_TRUE(part.find(".TP\n" + key + "\n") != std::string::npos ||
+                            part.find("Entries of \\(dq" + key + "\\(dq") != std::string::npos)
+                    << section << ", " << key;
+                std::string meaning(technology.meaningOf(section, key));
+                EXPECT_NE(part.find(plain(meaning.substr(0, meaning.find('"')))), std::string::npos)
+                    << section << ", " << key;
+            }
+        }
+        for (const LogCode code : codesOf(technology)) {
+            EXPECT_NE(chapter.find(std::string(technology.nameOf(code)) + "."), std::string::npos);
+        }
+    }
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,97 @@
+#include "tests/reference/ReferenceFixture.h"
+
+#include <gtest/gtest.h>
+
+namespace pallax {
+namespace {
+
+using doubles::Keys;
+
+/// Every key that is described, and each section itself as the empty key.
+Keys describedKeys(const TechnologyReference& technology) {
+    Keys keys = doubles::shownKeys(technology);
+    for (auto& [section, hidden] : doubles::hiddenKeys(technology)) {
+        keys[section].insert(hidden.begin(), hidden.end());
+    }
+    for (auto& [section, itsKeys] : keys) {
+        itsKeys.insert("");
+    }
+    return keys;
+}
+
+bool isSentence(std::string_view text) {
+    return text.size() > 3 && text.ends_with('.') && text.front() >= 'A' && text.front() <= 'Z' &&
+           text.find('\n') == std::string_view::npos;
+}
+
+TEST(Meanings, EveryKeyAndSectionThatIsDescribedHasOne) {
+    for (const TechnologyReference& technology : doubles::reference()) {
+        for (const auto& [section, keys] : describedKeys(technology)) {
+            for (const std::string& key : keys) {
+                EXPECT_TRUE(isSentence(technology.meaningOf(section, key)))
+                    << technology.title << ", section \"" << section << "\", key \"" << key
+                    << "\": add a sentence to its table in reference/meanings";
+            }
+        }
+    }
+}
+
+TEST(Meanings, EachIsOfAKeyThatIsDescribed) {
+    Keys all;
+    for (const TechnologyReference& technology : doubles::reference()) {
+        const Keys described = describedKeys(technology);
+        for (const Meaning& meaning : meaningsOf(technology).keys) {
+            EXPECT_TRUE(
+                described.contains(std::string(meaning.section)) &&
+                described.at(std::string(meaning.section)).contains(std::string(meaning.key)))
+                << technology.title << ", section \"" << meaning.section << "\", key \""
+                << meaning.key << "\"";
+        }
+        for (const auto& [section, keys] : described) {
+            all[section].insert(keys.begin(), keys.end());
+        }
+    }
+    for (const Meaning& meaning : commonMeanings().keys) {
+        EXPECT_TRUE(all[std::string(meaning.section)].contains(std::string(meaning.key)))
+            << meaning.section << ", " << meaning.key;
+    }
+}
+
+TEST(Meanings, NoKeyHasTwo) {
+    std::vector<Meanings> each = {commonMeanings()};
+    for (const TechnologyReference& technology : doubles::reference()) {
+        each.push_back(meaningsOf(technology));
+    }
+    for (const Meanings& meanings : each) {
+        std::set<std::pair<std::string_view, std::string_view>> keys;
+        for (const Meaning& meaning : meanings.keys) {
+            EXPECT_TRUE(keys.emplace(meaning.section, meaning.key).second)
+                << meaning.section << ", " << meaning.key;
+        }
+        std::set<LogCode> codes;
+        for (const CodeName& code : meanings.codes) {
+            EXPECT_TRUE(codes.insert(code.logCode).second) << std::hex << code.logCode;
+        }
+    }
+}
+
+TEST(Meanings, EveryLogCodeHasANameAndEveryNameALogCode) {
+    std::set<LogCode> all;
+    for (const TechnologyReference& technology : doubles::reference()) {
+        const std::vector<LogCode> codes = codesOf(technology);
+        for (const LogCode code : codes) {
+            EXPECT_FALSE(technology.nameOf(code).empty()) << technology.title << std::hex << code;
+        }
+        const std::set<LogCode> described(codes.begin(), codes.end());
+        for (const CodeName& name : meaningsOf(technology).codes) {
+            EXPECT_TRUE(described.contains(name.logCode)) << name.name;
+        }
+        all.insert(codes.begin(), codes.end());
+    }
+    for (const CodeName& name : commonMeanings().codes) {
+        EXPECT_TRUE(all.contains(name.logCode)) << name.name;
+    }
+}
+
+} // namespace
+} // namespace pallax

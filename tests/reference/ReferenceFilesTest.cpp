@@ -1,0 +1,46 @@
+#include "reference/ReferenceFiles.h"
+
+#include "host/DirectoryResources.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <fstream>
+#include <iterator>
+
+namespace pallax {
+namespace {
+
+const std::filesystem::path kTree = PALLAX_SOURCE_DIR;
+
+std::string contentOf(const std::filesystem::path& path) {
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
+}
+
+std::vector<ReferenceFile> files() {
+    return referenceFiles(DirectoryResources((kTree / "resources").string()),
+                          contentOf(kTree / "reference/dissector.lua"));
+}
+
+TEST(ReferenceFiles, TheTreeHoldsThemAsTheyAreWrittenNow) {
+    for (const ReferenceFile& file : files()) {
+        EXPECT_TRUE(contentOf(kTree / file.path) == file.text)
+            << file.path << " is not what the records' tables make of it. Write it anew:\n"
+            << "  ninja -C build/dev make_reference && build/dev/reference/make_reference .";
+    }
+}
+
+TEST(ReferenceFiles, ThereIsNoOtherFileBesideTheTables) {
+    std::set<std::string> written;
+    for (const ReferenceFile& file : files()) {
+        written.insert(file.path);
+    }
+    for (const auto& entry : std::filesystem::directory_iterator(kTree / "docs/records")) {
+        const std::string path = "docs/records/" + entry.path().filename().string();
+        EXPECT_TRUE(written.contains(path)) << path;
+    }
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,96 @@
+#pragma once
+
+#include "host/DirectoryResources.h"
+#include "host/Recording.h"
+#include "reference/Reference.h"
+
+#include <functional>
+#include <map>
+#include <set>
+#include <string>
+#include <vector>
+
+namespace pallax::doubles {
+
+/// Section to its keys.
+using Keys = std::map<std::string, std::set<std::string>>;
+
+/// The descriptions of the source tree's templates.
+inline std::vector<TechnologyReference> reference() {
+    return gatherReference(DirectoryResources(PALLAX_SOURCE_DIR "/resources"));
+}
+
+/// Calls `see` for every list of a code, also those within lists.
+inline void forEachList(const std::vector<ListDescription>& lists,
+                        const std::function<void(const ListDescription&)>& see) {
+    for (const ListDescription& list : lists) {
+        see(list);
+        forEachList(list.lists, see);
+    }
+}
+
+inline void forEachList(const CodeDescription& code,
+                        const std::function<void(const ListDescription&)>& see) {
+    forEachList(code.lists, see);
+    for (const SubpacketDescription& subpacket : code.subpackets) {
+        forEachList(subpacket.lists, see);
+    }
+}
+
+/// The keys that a code shows (or reads and keeps from the display) in its section.
+inline std::set<std::string> keysOf(const CodeDescription& code, bool shown) {
+    std::set<std::string> keys;
+    const auto add = [&keys](const std::string& key) {
+        if (!key.empty()) {
+            keys.insert(key);
+        }
+    };
+    const auto addFields = [&add](const std::vector<FieldDescription>& fields) {
+        for (const FieldDescription& field : fields) {
+            add(field.key);
+        }
+    };
+    if (shown) {
+        addFields(code.fields);
+        for (const SubpacketDescription& subpacket : code.subpackets) {
+            addFields(subpacket.fields);
+        }
+    }
+    forEachList(code, [&](const ListDescription& list) {
+        if (list.isShown == shown) {
+            add(list.key);
+            addFields(list.fields);
+        }
+    });
+    return keys;
+}
+
+/// Section to the keys that are described as shown, of one technology.
+inline Keys shownKeys(const TechnologyReference& technology) {
+    Keys keys;
+    for (const SectionReference& section : technology.sections) {
+        keys[section.name].insert(section.objectKeys.begin(), section.objectKeys.end());
+        for (const CodeDescription& code : section.codes) {
+            keys[section.name].merge(keysOf(code, true));
+        }
+    }
+    return keys;
+}
+
+/// The same of those that are read and kept from the display, and are shown by no other code.
+inline Keys hiddenKeys(const TechnologyReference& technology) {
+    const Keys shown = shownKeys(technology);
+    Keys keys;
+    for (const SectionReference& section : technology.sections) {
+        for (const CodeDescription& code : section.codes) {
+            for (const std::string& key : keysOf(code, false)) {
+                if (!shown.at(section.name).contains(key)) {
+                    keys[section.name].insert(key);
+                }
+            }
+        }
+    }
+    return keys;
+}
+
+} // namespace pallax::doubles
