@@ -51,7 +51,7 @@ if(PALLAX_PRECOMPILE)
     add_library(pallax_precompiled STATIC ${PROJECT_BINARY_DIR}/precompiled.cpp)
     target_link_libraries(pallax_precompiled PUBLIC pallax_options)
     target_precompile_headers(pallax_precompiled PRIVATE
-        <algorithm> <array> <chrono> <cmath> <cstdint> <filesystem> <functional> <map> <memory>
+        <algorithm> <array> <chrono> <cmath> <cstdint> <functional> <map> <memory>
         <optional> <span> <stdexcept> <string> <string_view> <variant> <vector>
     )
     pallax_instrument_for_fuzzing(pallax_precompiled)
