@@ -42,7 +42,7 @@ protected:
     };
 
     std::string pipe(const std::string& name) const {
-        const std::string path = world.path(name);
+        std::string path = world.path(name);
         EXPECT_EQ(::mkfifo(path.c_str(), S_IRUSR | S_IWUSR), 0);
         return path;
     }
