@@ -119,8 +119,9 @@ void appendPlaces(const Dictionary& entries, const std::string& path,
     }
     for (const Dictionary::Entry& entry : entries) {
         if (const DictionaryRef inner = entry.value.dictionary()) {
-            const std::string key = entry.key.string();
-            appendPlaces(*inner, path.empty() ? key : path + " / " + key, codes, sections);
+            std::string innerPath = path;
+            innerPath.append(path.empty() ? "" : " / ").append(entry.key.string());
+            appendPlaces(*inner, innerPath, codes, sections);
         }
     }
 }
