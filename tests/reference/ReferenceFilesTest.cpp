@@ -20,7 +20,7 @@ std::string contentOf(const std::filesystem::path& path) {
 
 std::vector<ReferenceFile> files() {
     return referenceFiles(DirectoryResources((kTree / "resources").string()),
-                          contentOf(kTree / "reference/dissector.lua"));
+                          dissectorProgram(kTree.string()));
 }
 
 TEST(ReferenceFiles, TheTreeHoldsThemAsTheyAreWrittenNow) {
