@@ -8,6 +8,7 @@
 #include "reference/IfxSections.h"
 
 #include <algorithm>
+#include <array>
 #include <map>
 #include <set>
 #include <stdexcept>
