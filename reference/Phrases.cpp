@@ -172,7 +172,7 @@ std::string decimal(double number) {
 }
 
 std::string inWords(const Position& position) {
-    const std::string byte = "byte " + std::to_string(position.byte);
+    std::string byte = "byte " + std::to_string(position.byte);
     if (position.bit == 0 && position.width == kByteBits) {
         return byte;
     }

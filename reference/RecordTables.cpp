@@ -93,8 +93,9 @@ std::string recordTablesIndex(std::span<const TechnologyReference> technologies)
         "| technology | link type | on the command line | tables |\n|---|---|---|---|\n");
     for (const TechnologyReference& each : technologies) {
         const std::string name(each.technology->commandName);
-        text += "| " + std::string(each.title) + " | " + std::to_string(each.technology->linkType) +
-                " | `" + name + "` | [" + name + ".md](" + name + ".md) |\n";
+        text.append("| ").append(each.title).append(" | ");
+        text.append(std::to_string(each.technology->linkType)).append(" | `").append(name);
+        text.append("` | [").append(name).append(".md](").append(name).append(".md) |\n");
     }
     return text.append(kHowToRead);
 }

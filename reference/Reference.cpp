@@ -8,6 +8,7 @@
 #include "reference/IfxSections.h"
 
 #include <algorithm>
+#include <array>
 #include <map>
 #include <set>
 #include <stdexcept>
@@ -119,8 +120,9 @@ void appendPlaces(const Dictionary& entries, const std::string& path,
     }
     for (const Dictionary::Entry& entry : entries) {
         if (const DictionaryRef inner = entry.value.dictionary()) {
-            const std::string key = entry.key.string();
-            appendPlaces(*inner, path.empty() ? key : path + " / " + key, codes, sections);
+            std::string innerPath = path;
+            innerPath.append(path.empty() ? "" : " / ").append(entry.key.string());
+            appendPlaces(*inner, innerPath, codes, sections);
         }
     }
 }

@@ -5,7 +5,25 @@
 #include "reference/RecordTables.h"
 #include "reference/SectionsPage.h"
 
+#include <fstream>
+#include <iterator>
+#include <stdexcept>
+
 namespace pallax {
+
+std::string dissectorProgram(const std::string& tree) {
+    std::string program;
+    for (const char* name : {"numbers", "computations", "items", "records"}) {
+        const std::string path = tree + "/reference/dissector/" + name + ".lua";
+        std::ifstream file(path, std::ios::binary);
+        if (!file) {
+            throw std::runtime_error(path + " cannot be read");
+        }
+        program.append(program.empty() ? "" : "\n");
+        program.append(std::istreambuf_iterator<char>(file), {});
+    }
+    return program;
+}
 
 std::vector<ReferenceFile> referenceFiles(const Resources& resources, const std::string& program) {
     const std::vector<TechnologyReference> technologies = gatherReference(resources);

@@ -13,8 +13,11 @@ struct ReferenceFile {
     std::string text;
 };
 
-/// All of them. `resources` holds the templates; `program` is the
-/// part of the dissector that is written by hand (dissector.lua beside this file).
+/// The part of the dissector that is written by hand: the files of the folder reference/dissector
+/// of a source tree, in their order. Throws std::runtime_error where one cannot be read.
+std::string dissectorProgram(const std::string& tree);
+
+/// All of them. `resources` holds the templates; `program` is what `dissectorProgram` gives.
 std::vector<ReferenceFile> referenceFiles(const Resources& resources, const std::string& program);
 
 } // namespace pallax

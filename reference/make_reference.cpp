@@ -7,17 +7,14 @@
 #include <exception>
 #include <filesystem>
 #include <fstream>
-#include <iterator>
 #include <string>
 
 namespace {
 
 int writeInto(const std::filesystem::path& tree) {
-    std::ifstream dissector(tree / "reference/dissector.lua", std::ios::binary);
-    const std::string written{std::istreambuf_iterator<char>(dissector),
-                              std::istreambuf_iterator<char>()};
+    const std::string program = pallax::dissectorProgram(tree.string());
     const pallax::DirectoryResources resources((tree / "resources").string());
-    for (const pallax::ReferenceFile& file : pallax::referenceFiles(resources, written)) {
+    for (const pallax::ReferenceFile& file : pallax::referenceFiles(resources, program)) {
         const std::filesystem::path path = tree / file.path;
         std::filesystem::create_directories(path.parent_path());
         std::ofstream out(path, std::ios::binary);

@@ -143,6 +143,7 @@ PropertyList C2KLogGenerator::generateLogUsingState(Dictionary& state) {
 
 std::vector<CodeDescription> C2KLogGenerator::describe() {
     std::vector<CodeDescription> description;
+    description.reserve(kParsers.size());
     for (const Parser& parser : kParsers) {
         description.push_back(parser.describe(parser.logCode));
     }

@@ -1,7 +1,7 @@
 -- Shows the log records of radio modems as Pallax decodes them.
 --
 -- Written by make_reference out of the tables that the records are decoded with, and of
--- reference/dissector.lua. To use it:
+-- reference/dissector. To use it:
 --
 --     wireshark -X lua_script:pallax.lua RECORDING
 --     tshark -X lua_script:pallax.lua -V -r RECORDING

@@ -2,6 +2,7 @@
 #include "LogGenerator/LTE/LTEClassIndex.h"
 #include "LogGenerator/UTRAN/UTRANClassIndex.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
+#include "reference/ReferenceFiles.h"
 #include "reference/SectionsPage.h"
 #include "tests/doubles/C2KLookupNames.h"
 #include "tests/doubles/FakeStandardOutput.h"
@@ -9,9 +10,6 @@
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-
-#include <fstream>
-#include <iterator>
 
 namespace pallax {
 namespace {
@@ -76,8 +74,7 @@ TEST(Descriptions, TheParsersOfCdmaDescribeEveryLookupName) {
 }
 
 TEST(Descriptions, EveryComputationIsOneOfTheDissectors) {
-    std::ifstream file(PALLAX_SOURCE_DIR "/reference/dissector.lua");
-    const std::string program{std::istreambuf_iterator<char>(file), {}};
+    const std::string program = dissectorProgram(PALLAX_SOURCE_DIR);
     const auto expectIn = [&program](const std::vector<FieldDescription>& fields) {
         for (const FieldDescription& field : fields) {
             const std::string function =

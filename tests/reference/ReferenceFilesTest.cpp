@@ -7,6 +7,7 @@
 #include <filesystem>
 #include <fstream>
 #include <iterator>
+#include <set>
 
 namespace pallax {
 namespace {
@@ -20,7 +21,7 @@ std::string contentOf(const std::filesystem::path& path) {
 
 std::vector<ReferenceFile> files() {
     return referenceFiles(DirectoryResources((kTree / "resources").string()),
-                          contentOf(kTree / "reference/dissector.lua"));
+                          dissectorProgram(kTree.string()));
 }
 
 TEST(ReferenceFiles, TheTreeHoldsThemAsTheyAreWrittenNow) {
