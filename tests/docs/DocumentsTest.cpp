@@ -33,6 +33,7 @@ constexpr auto kNotRun = std::to_array<std::string_view>({
     "cpack ",
     "systemctl ",
     "build/dev/tests/",
+    "ninja ",
 });
 
 /// Commands that go on until they are left: they get Ctrl-C after a second, and end well.
