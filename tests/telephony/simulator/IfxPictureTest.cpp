@@ -130,24 +130,36 @@ TEST(IfxPicture, ItsFormsHoldTheSameAndItsXmlIsThatOfTheSerialiser) {
 }
 
 TEST(IfxPicture, AMessageThatHoldsTooMuchIsRefused) {
-    const auto writeTexts = [](std::size_t count, const std::string& text) {
-        ifx::BinaryObjectWriter writer;
+    using ifx::BinaryObjectWriter;
+    /// How many texts are read back of `lists` arrays that hold `count` of them each.
+    const auto writeTexts = [](std::size_t lists, std::size_t count, const std::string& text) {
+        BinaryObjectWriter writer;
         writer.beginArray();
-        for (std::size_t index = 0; index < count; ++index) {
-            writer.text(text);
+        for (std::size_t list = 0; list < lists; ++list) {
+            writer.beginArray();
+            for (std::size_t index = 0; index < count; ++index) {
+                writer.text(text);
+            }
+            writer.endArray();
         }
         writer.endArray();
         ByteBuffer out;
         writer.finish(out);
         const auto object = parsePropertyList(out);
-        return object && object->array() ? object->array()->size() : 0;
+        std::size_t texts = 0;
+        for (const PropertyList& list : *object->array()) {
+            texts += list.array()->size();
+        }
+        return texts;
     };
-    EXPECT_EQ(writeTexts(20, "a text of more than fifteen letters"), 20U);
-    EXPECT_THROW(writeTexts(1, std::string(256, 'a')), std::length_error);
-    EXPECT_THROW(writeTexts(ifx::BinaryObjectWriter::kMostPending + 1, "a"), std::length_error);
-    EXPECT_THROW(writeTexts(100, std::string(255, 'a')), std::length_error);
-    ifx::BinaryObjectWriter deep;
-    for (std::size_t depth = 0; depth < ifx::BinaryObjectWriter::kDeepest; ++depth) {
+    constexpr std::size_t kMost = BinaryObjectWriter::kMostInContainer;
+    EXPECT_EQ(writeTexts(3, kMost, "a text of more than fifteen letters"), 3 * kMost);
+    EXPECT_EQ(writeTexts(1, 0, ""), 0U);
+    EXPECT_THROW(writeTexts(1, 1, std::string(256, 'a')), std::length_error);
+    EXPECT_THROW(writeTexts(1, kMost + 1, "a"), std::length_error);
+    EXPECT_THROW(writeTexts(kMost, kMost, std::string(255, 'a')), std::length_error);
+    BinaryObjectWriter deep;
+    for (std::size_t depth = 0; depth < BinaryObjectWriter::kDeepest; ++depth) {
         deep.beginArray();
     }
     EXPECT_THROW(deep.beginArray(), std::length_error);
