@@ -13,10 +13,12 @@ namespace {
 
 /// Nothing for what has no size; 0 for what is not there and will not be decoded.
 std::optional<std::uint64_t> sizeOf(const std::string& path) {
+    if (path == "-") {
+        return std::nullopt;
+    }
     std::error_code error;
-    const auto status = std::filesystem::status(path, error);
-    if (!std::filesystem::exists(status)) {
-        return path == "-" ? std::nullopt : std::optional<std::uint64_t>(0);
+    if (!std::filesystem::exists(std::filesystem::status(path, error))) {
+        return 0;
     }
     const std::uint64_t size = std::filesystem::file_size(path, error);
     return error ? std::nullopt : std::optional(size);
@@ -50,8 +52,12 @@ DecodeProgress::DecodeProgress(const std::vector<std::string>& recordings, Termi
 }
 
 DecodeProgress::~DecodeProgress() {
-    if (!_isWorker) {
-        wipe();
+    wipe();
+}
+
+void DecodeProgress::wipe() {
+    if (!_isWorker) { // which may have been forked while something was shown
+        _line.wipe();
     }
 }
 

@@ -9,7 +9,6 @@
 #include <cstdint>
 #include <memory>
 #include <optional>
-#include <span>
 #include <string>
 #include <vector>
 
@@ -34,7 +33,7 @@ public:
     /// Shows what is counted, if it is time.
     void look();
     /// Before anything else is written to the terminal.
-    void wipe() { _line.wipe(); }
+    void wipe();
 
 private:
     struct Tally {

@@ -21,7 +21,7 @@ sets its own pace and loses nothing.
 
 Exit status:
   0   success: ended by Ctrl-C, or by the whole of what was relayed
-  1   failure: nothing to serve, or a service runs already; --status: none runs
+  1   failure: one sentence on standard error tells which
   2   wrong usage)";
 
 void addServicePlay(CLI::App& app, ServiceOptions& options) {

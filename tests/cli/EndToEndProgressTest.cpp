@@ -85,10 +85,12 @@ TEST_F(EndToEndProgress, OfAFileIsTheShareOfItsBytes) {
     const std::string drive = world.path("drive.pcap");
     const std::string written = world.path("written");
     ASSERT_EQ(run({"simulate", "lte", "--seconds", "60", "-o", drive}).status, 0);
-    // A reader of the output that takes three seconds lets the file be read slowly.
+    // A reader that takes the output slowly lets the file be read slowly.
+    const std::string slowly = "{ sleep 1; for each in $(seq 12); do head -c 300000; sleep 0.2; "
+                               "done; cat; }";
     PallaxTerminal terminal(world,
                             {"-c", doubles::programPath() + " decode --every packet " + drive +
-                                       " | { sleep 3; cat >" + written + "; }"},
+                                       " | " + slowly + " >" + written},
                             {.program = "/bin/sh"});
     EXPECT_TRUE(terminal.shows("#"));
     EXPECT_EQ(terminal.wait(), 0);

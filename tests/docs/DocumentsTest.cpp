@@ -36,7 +36,7 @@ constexpr auto kNotRun = std::to_array<std::string_view>({
     "ninja ",
 });
 
-/// Commands that go on until they are left: they get Ctrl-C after a second, and end well.
+/// Commands that go on until they are left: they get Ctrl-C after two seconds, and end well.
 constexpr auto kUntilLeft = std::to_array<std::string_view>({
     "pallax",
     "pallax demo lte --seed 7",
@@ -59,7 +59,7 @@ mkdir monday && cp samples/lte-drive.pcap samples/cdma-drive.pcap monday
 cat >"$BIN/modem-dump" <<'END'
 #!/bin/sh
 head -c 24 samples/lte-drive.pcap
-sleep 1
+sleep 3
 tail -c +25 samples/lte-drive.pcap
 END
 cat >"$BIN/ssh" <<'END'
@@ -160,7 +160,7 @@ protected:
             if (isRun(command)) {
                 const std::string name = folder.path("out/" + std::to_string(number));
                 script << "{ "
-                       << (goesOn(command) ? "timeout --foreground --preserve-status -s INT 1 "
+                       << (goesOn(command) ? "timeout --foreground --preserve-status -s INT 2 "
                                            : "")
                        << command.command << "\n} >" << name << " 2>&1 </dev/null\necho $? >"
                        << name << ".status\n";

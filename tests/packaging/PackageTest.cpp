@@ -16,7 +16,7 @@ using doubles::isInstalled;
 using doubles::runCommand;
 using doubles::TemporaryFolder;
 
-/// The Debian package, made once for all of the tests.
+/// The Debian package, made anew for each process of these tests.
 class Package : public testing::Test {
 protected:
     static void SetUpTestSuite() {
