@@ -171,6 +171,19 @@ std::string inWords(const EntryRun& run) {
            (run.layout.stride == 1 ? " byte" : " bytes");
 }
 
+/// The size check of a list that has one: a sentence.
+std::string sizeCheckOf(const ListDescription& list) {
+    if (!list.sizeCheck || !list.count) {
+        return "";
+    }
+    const SizeCheck& check = *list.sizeCheck;
+    return " The list is empty if " + inWords(*list.count) +
+           " is 0, or if the low byte of its length, " +
+           std::to_string(list.entries.layout.stride) +
+           " x that number, is greater than the low byte of the record's length less " +
+           std::to_string(check.otherLength) + " x " + inWords(check.otherCount) + ".";
+}
+
 std::string countOf(const ListDescription& list) {
     if (!list.count) {
         return std::to_string(list.plus) + " entries";
@@ -276,6 +289,7 @@ std::string layoutOf(const ListDescription& list) {
     } else if (list.fit == ListDescription::Fit::Exact) {
         text += " The record must end with the last one.";
     }
+    text += sizeCheckOf(list);
     if (!list.ifEmpty.empty()) {
         text += " Without entries " + quoted(list.ifEmpty) + ".";
     }
