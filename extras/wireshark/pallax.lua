@@ -1203,12 +1203,16 @@ computations["old frame errors"] = function(v, _, context)
   end)
 end
 
+-- Where the bytes of an extent are counted from.
+local function origin_of(context, extent)
+  if extent.of == "record" then return 0 end
+  return extent.of == "companion" and context.companion or context.start
+end
+
 local function values_of(context, field)
   local values = {}
   for index, extent in ipairs(field.read) do
-    local start = context.start
-    if extent.of == "record" then start = 0 end
-    if extent.of == "companion" then start = context.companion end
+    local start = origin_of(context, extent)
     if extent.length <= 4 then
       local position = whole_bytes(extent.byte, extent.length)
       values[index] = number_at(context.record, start, position)
@@ -1241,14 +1245,22 @@ local function holds(context, condition)
   return number >= condition.least and number <= condition.most
 end
 
+-- The bytes of a field; of a computed one from the first to the last that is read where its first
+-- extent lies.
 local function range_of_field(context, field)
   if field.position then
     local position = field.position
     return range_of(context.record, context.start + position.byte, byte_count(position))
   end
-  local extent = field.read[1]
-  local start = extent.of == "companion" and context.companion or context.start
-  return range_of(context.record, start + extent.byte, extent.length)
+  local of, first, last = field.read[1].of, math.huge, 0
+  for _, extent in ipairs(field.read) do
+    if extent.of == of then
+      first = math.min(first, extent.byte)
+      last = math.max(last, extent.byte + extent.length)
+    end
+  end
+  local start = origin_of(context, field.read[1])
+  return range_of(context.record, start + first, last - first)
 end
 
 -- The text that a field shows, and its number where that is one; nothing where it shows nothing.
@@ -1494,7 +1506,7 @@ local function add_header(technology, record, tree, code, name)
   local label = string.format("Log code: 0x%04X", code) .. (name and ", " .. name or "")
   tree:add(header.code, record(3, 2), code, label)
   tree:add(header.name, record(3, 2), name or "", "Name: " .. (name or "unknown"))
-  tree:add(header.length, record:range(), record:len())
+  tree:add(header.length, record:range(), record:len()):set_generated()
 end
 
 local function dissect_record(technology, buffer, pinfo, tree)
@@ -1564,7 +1576,7 @@ local function register(technology)
     type = ProtoField.uint8(technology.name .. ".type", "Log type", base.HEX),
     code = ProtoField.uint32(technology.name .. ".code", "Log code", base.HEX),
     name = ProtoField.string(technology.name .. ".name", "Name"),
-    length = ProtoField.uint32(technology.name .. ".length", "Length"),
+    length = ProtoField.uint32(technology.name .. ".length", "Record length"),
   }
   for _, field in pairs(technology.header) do fields[#fields + 1] = field end
   proto.fields = fields
