@@ -2,8 +2,11 @@
 
 #include "platform/Format.h"
 
+#include <algorithm>
 #include <array>
 #include <charconv>
+#include <cstdint>
+#include <limits>
 
 namespace pallax {
 
@@ -11,6 +14,36 @@ namespace {
 
 constexpr unsigned kByteBits = 8;
 constexpr std::int64_t kLargestByte = 255;
+
+/// The raw numbers that a field can show, both ends included.
+struct RawRange {
+    std::int64_t least;
+    std::int64_t most;
+
+    bool holds(std::int64_t raw) const { return raw >= least && raw <= most; }
+    std::int64_t count() const { return most - least + 1; }
+};
+
+bool isSame(const Position& one, const Position& other) {
+    return one.byte == other.byte && one.bit == other.bit && one.width == other.width &&
+           one.isSigned == other.isSigned && one.bigEndian == other.bigEndian;
+}
+
+/// What the width of the position leaves, and a condition on the field's own number.
+RawRange rawRangeOf(const FieldDescription& field) {
+    if (!field.position) {
+        return {std::numeric_limits<std::int32_t>::min(), std::numeric_limits<std::int32_t>::max()};
+    }
+    const Position& position = *field.position;
+    const std::int64_t values = std::int64_t{1} << position.width;
+    RawRange range =
+        position.isSigned ? RawRange{-values / 2, values / 2 - 1} : RawRange{0, values - 1};
+    const auto& condition = field.condition;
+    if (condition && !condition->subpacket && isSame(condition->position, position)) {
+        range = {std::max(range.least, condition->least), std::min(range.most, condition->most)};
+    }
+    return range;
+}
 
 std::string quoted(std::string_view text) {
     std::string result("\"");
@@ -40,16 +73,22 @@ std::string numberOf(const ShownAs& shownAs) {
     return scaled + ", as " + quoted(format);
 }
 
-std::string labelsOf(const ShownAs& shownAs) {
+/// The labels that the raw numbers can reach, and what stands for the others if there are any.
+std::string labelsOf(const ShownAs& shownAs, const RawRange& range) {
     std::string text;
+    std::int64_t labelled = 0;
     for (std::size_t index = 0; index < shownAs.labels.size(); ++index) {
         const bool beyond =
             shownAs.beyondFormat == nullptr && shownAs.labels[index] == shownAs.beyond;
-        if (!beyond) {
-            const auto raw = static_cast<std::uint8_t>(index - shownAs.shift);
+        const auto raw = static_cast<std::uint8_t>(index - shownAs.shift);
+        if (!beyond && range.holds(raw)) {
+            ++labelled;
             text.append(text.empty() ? "" : ", ").append(std::to_string(raw)).append(" ");
             text.append(quoted(shownAs.labels[index]));
         }
+    }
+    if (labelled == range.count()) {
+        return text;
     }
     return text + "; otherwise " +
            quoted(shownAs.beyondFormat != nullptr ? printfText(*shownAs.beyondFormat)
@@ -72,13 +111,12 @@ std::string inWords(const Condition& condition) {
                                              : text + " to " + std::to_string(condition.most);
 }
 
-std::string exceptionOf(const ShownAs& shownAs) {
-    if (!shownAs.exceptional) {
+std::string exceptionOf(const FieldDescription& field) {
+    const ShownAs& shownAs = field.shownAs;
+    if (!shownAs.exceptional || !rawRangeOf(field).holds(*shownAs.exceptional)) {
         return "";
     }
-    const std::string text =
-        shownAs.exceptionalText.empty() ? "nothing" : quoted(shownAs.exceptionalText);
-    return "; " + text + " for " + std::to_string(*shownAs.exceptional);
+    return "; " + quoted(shownAs.exceptionalText) + " for " + std::to_string(*shownAs.exceptional);
 }
 
 std::string conditionOf(const FieldDescription& field) {
@@ -103,7 +141,7 @@ std::string valueOf(const FieldDescription& field) {
     if (!field.position) {
         return "as it comes";
     }
-    return shownAs.labels.empty() ? quoted(shownAs.beyond) : labelsOf(shownAs);
+    return shownAs.labels.empty() ? quoted(shownAs.beyond) : labelsOf(shownAs, rawRangeOf(field));
 }
 
 std::string placeOf(const Extent& extent) {
@@ -131,6 +169,19 @@ std::string inWords(const EntryRun& run) {
     }
     return text + ", every " + std::to_string(run.layout.stride) +
            (run.layout.stride == 1 ? " byte" : " bytes");
+}
+
+/// The size check of a list that has one: a sentence.
+std::string sizeCheckOf(const ListDescription& list) {
+    if (!list.sizeCheck || !list.count) {
+        return "";
+    }
+    const SizeCheck& check = *list.sizeCheck;
+    return " The list is empty if " + inWords(*list.count) +
+           " is 0, or if the low byte of its length, " +
+           std::to_string(list.entries.layout.stride) +
+           " x that number, is greater than the low byte of the record's length less " +
+           std::to_string(check.otherLength) + " x " + inWords(check.otherCount) + ".";
 }
 
 std::string countOf(const ListDescription& list) {
@@ -213,7 +264,7 @@ std::string bitsOf(const FieldDescription& field) {
 }
 
 std::string shownOf(const FieldDescription& field) {
-    return valueOf(field) + exceptionOf(field.shownAs) + conditionOf(field);
+    return valueOf(field) + exceptionOf(field) + conditionOf(field);
 }
 
 std::string unitOf(const FieldDescription& field) {
@@ -238,6 +289,7 @@ std::string layoutOf(const ListDescription& list) {
     } else if (list.fit == ListDescription::Fit::Exact) {
         text += " The record must end with the last one.";
     }
+    text += sizeCheckOf(list);
     if (!list.ifEmpty.empty()) {
         text += " Without entries " + quoted(list.ifEmpty) + ".";
     }

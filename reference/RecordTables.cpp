@@ -21,6 +21,9 @@ and a subpacket are counted from their own first byte. The columns:
 - **unit**: of a number that is shown.
 
 Bytes beyond the end of a record read as zero, and a list ends at the first entry that is not whole.
+
+The dissector in `extras/wireshark` shows all of this but what comes out of property lists: of these it
+shows the bytes and, in the XML form, the keys and values as they stand there.
 )";
 
 /// A text inside a table's cell or a sentence.

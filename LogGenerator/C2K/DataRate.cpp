@@ -60,8 +60,9 @@ FieldDescription describeDataRate(const DataRateNames& names, const Position& se
                                   const Extent& bytes, std::vector<Counter> counters) {
     FieldDescription field =
         describeComputed(names.rate, kRate, "data rate",
-                         "by how much the weighted sum of the counters has grown since the packet "
-                         "before, by 1024 steps of the sequence number",
+                         "growth of the weighted sum of the counters since the packet before, "
+                         "divided by 1024 x the growth of the sequence number; empty at the first "
+                         "packet, unchanged where the number has not grown",
                          {extentOf(sequence), bytes});
     field.counters = std::move(counters);
     return field;

@@ -194,7 +194,9 @@ CodeDescription describeOneXStatus(LogCode logCode) {
     pilots.fields = {describeComputed(
         "", kSignedLevelDb, "scaled energy",
         "10 x log10 of 2^(2e - 3) x E / (9 x N^2 x g) - 1 / N, at least 0.00001: E, 16 bits, at "
-        "4m + 24 of the pilot, N, g and e of the subpacket",
+        "4m + 24 of the pilot, N, 16 bits, at 4, g at 6 and e at 7 of the subpacket; for the pilot "
+        "whose PN is the reference, the 16 bits at byte 10 of the subpacket, as \"(ref pilot) "
+        "%+.2f dB\", for the others",
         {{kEnergyDivisor, sizeof(std::uint16_t)},
          {kEnergyGain},
          {kEnergyExponent},

@@ -77,8 +77,10 @@ CodeDescription describeReverseDataRate(LogCode logCode) {
             }
         }
     }
+    const std::size_t lastRow = rowStart(kWeights.size() - 1, kBlocks * kRows - 1);
+    const std::size_t end = lastRow + kCountersInARow * kCounterLength;
     CodeDescription code{logCode, kMinimumLength};
-    code.fields = {describeDataRate(kNames, u32At(kSequence), {kCounters, kBlocks * kBlockLength},
+    code.fields = {describeDataRate(kNames, u32At(kSequence), {kCounters, end - kCounters},
                                     std::move(counters))};
     return code;
 }

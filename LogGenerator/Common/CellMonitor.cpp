@@ -116,6 +116,9 @@ CodeDescription describeCells(std::string_view part, std::span<const CellNumber>
                               std::span<const CellLevel> levels) {
     CodeDescription code{kCellMonitorLogCode};
     code.listPart = part;
+    if (!levels.empty()) {
+        code.note = "Of a level only the low 16 bits count, as a signed number.";
+    }
     for (const CellNumber& number : numbers) {
         FieldDescription field{std::string(number.key)};
         field.shownAs.format = &kDecimal;

@@ -65,7 +65,6 @@ RecordDescription MeasuredNeighborCells::describe() const {
     list.sizeCheck = SizeCheck{u8At(kDetectedCountOffset), kDetectedEntryLength};
     CodeDescription code{kConnectedModeLogCode, kConnectedModeLength};
     code.lists = {std::move(list)};
-    code.note = "A record whose counts claim more than it seems to hold empties the list.";
     return {std::move(code)};
 }
 

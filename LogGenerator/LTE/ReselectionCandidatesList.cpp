@@ -135,6 +135,11 @@ RecordDescription ReselectionCandidatesList::describe() const {
     }
     CodeDescription code{kReselectionLogCode, kReselectionLength};
     code.lists = {std::move(list)};
+    code.note =
+        "Neighbouring entries overlap: of an entry 8 bytes are read, 12 with RAT type 3 or 4, and "
+        "4 "
+        "with a type beyond, so that its fields from byte 4 on are also the beginning of the "
+        "entries after it.";
     return {std::move(code)};
 }
 

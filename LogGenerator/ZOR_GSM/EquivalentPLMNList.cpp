@@ -63,7 +63,7 @@ RecordDescription EquivalentPLMNList::describe() const {
     list.fields = {digits(kCountryCodeKey, 0), digits(kNetworkCodeKey, 1)};
     CodeDescription code{kEquivalentPLMNLogCode, kMinimumLength};
     code.lists = {std::move(list)};
-    code.note = "Neighbouring entries overlap by three bytes.";
+    code.note = "Neighbouring entries overlap by three bytes: of an entry 6 bytes are read.";
     return {std::move(code)};
 }
 

@@ -507,7 +507,7 @@ local technologies = {
         {
           head = { section = "Data Rates", least = 241 },
           fields = {
-            { key = "Forward Link", filter = "data_rates.forward_link", computation = "data rate", formula = "by how much the weighted sum of the counters has grown since the packet before, by 1024 steps of the sequence number", read = { { byte = 13, length = 4 }, { byte = 17, length = 224 } }, counters = { { 17, 128 }, { 21, 256 }, { 25, 512 }, { 29, 1024 }, { 37, 128 }, { 41, 256 }, { 45, 512 }, { 49, 1024 }, { 57, 128 }, { 61, 256 }, { 65, 512 }, { 69, 1024 }, { 77, 128 }, { 81, 256 }, { 85, 512 }, { 89, 1024 }, { 97, 128 }, { 101, 256 }, { 105, 512 }, { 109, 1024 }, { 117, 512 }, { 121, 1024 }, { 125, 2048 }, { 133, 128 }, { 137, 256 }, { 141, 512 }, { 145, 1024 }, { 153, 512 }, { 157, 1024 }, { 161, 2048 }, { 169, 1024 }, { 173, 3072 }, { 181, 512 }, { 185, 1024 }, { 189, 2048 }, { 197, 4096 }, { 205, 1024 }, { 209, 3072 }, { 217, 4096 }, { 225, 5120 }, { 233, 5120 } }, format = { number = "%.2f", behind = " kbps", real = true, width = 0 } },
+            { key = "Forward Link", filter = "data_rates.forward_link", computation = "data rate", formula = "growth of the weighted sum of the counters since the packet before, divided by 1024 x the growth of the sequence number; empty at the first packet, unchanged where the number has not grown", read = { { byte = 13, length = 4 }, { byte = 17, length = 224 } }, counters = { { 17, 128 }, { 21, 256 }, { 25, 512 }, { 29, 1024 }, { 37, 128 }, { 41, 256 }, { 45, 512 }, { 49, 1024 }, { 57, 128 }, { 61, 256 }, { 65, 512 }, { 69, 1024 }, { 77, 128 }, { 81, 256 }, { 85, 512 }, { 89, 1024 }, { 97, 128 }, { 101, 256 }, { 105, 512 }, { 109, 1024 }, { 117, 512 }, { 121, 1024 }, { 125, 2048 }, { 133, 128 }, { 137, 256 }, { 141, 512 }, { 145, 1024 }, { 153, 512 }, { 157, 1024 }, { 161, 2048 }, { 169, 1024 }, { 173, 3072 }, { 181, 512 }, { 185, 1024 }, { 189, 2048 }, { 197, 4096 }, { 205, 1024 }, { 209, 3072 }, { 217, 4096 }, { 225, 5120 }, { 233, 5120 } }, format = { number = "%.2f", behind = " kbps", real = true, width = 0 } },
           },
         },
       },
@@ -535,7 +535,7 @@ local technologies = {
                 {
                   layout = { key = "Active Set", start = 0, stride = 0, bytes_read = 0, count = { byte = 8, bit = 0, width = 8 }, plus = 0, entry_name = { byte = 12, bit = 0, width = 16 }, varying = true },
                   fields = {
-                    { key = "", filter = "1x.active_set", computation = "scaled energy", formula = "10 x log10 of 2^(2e - 3) x E / (9 x N^2 x g) - 1 / N, at least 0.00001: E, 16 bits, at 4m + 24 of the pilot, N, g and e of the subpacket", read = { { byte = 4, length = 2 }, { byte = 6, length = 1 }, { byte = 7, length = 1 }, { byte = 9, length = 1 }, { byte = 10, length = 2 } }, format = { number = "%+.2f", behind = " dB", real = true, width = 0 } },
+                    { key = "", filter = "1x.active_set", computation = "scaled energy", formula = "10 x log10 of 2^(2e - 3) x E / (9 x N^2 x g) - 1 / N, at least 0.00001: E, 16 bits, at 4m + 24 of the pilot, N, 16 bits, at 4, g at 6 and e at 7 of the subpacket; for the pilot whose PN is the reference, the 16 bits at byte 10 of the subpacket, as \"(ref pilot) %+.2f dB\", for the others", read = { { byte = 4, length = 2 }, { byte = 6, length = 1 }, { byte = 7, length = 1 }, { byte = 9, length = 1 }, { byte = 10, length = 2 } }, format = { number = "%+.2f", behind = " dB", real = true, width = 0 } },
                   },
                 },
               },
@@ -609,7 +609,7 @@ local technologies = {
         {
           head = { section = "Data Rates", least = 1750 },
           fields = {
-            { key = "Reverse Link", filter = "data_rates.reverse_link", computation = "data rate", formula = "by how much the weighted sum of the counters has grown since the packet before, by 1024 steps of the sequence number", read = { { byte = 14, length = 4 }, { byte = 18, length = 1728 } }, counters = { { 18, 128 }, { 22, 128 }, { 26, 128 }, { 30, 128 }, { 306, 128 }, { 310, 128 }, { 314, 128 }, { 318, 128 }, { 594, 128 }, { 598, 128 }, { 602, 128 }, { 606, 128 }, { 882, 128 }, { 886, 128 }, { 890, 128 }, { 894, 128 }, { 1170, 128 }, { 1174, 128 }, { 1178, 128 }, { 1182, 128 }, { 1458, 128 }, { 1462, 128 }, { 1466, 128 }, { 1470, 128 }, { 42, 256 }, { 46, 256 }, { 50, 256 }, { 54, 256 }, { 330, 256 }, { 334, 256 }, { 338, 256 }, { 342, 256 }, { 618, 256 }, { 622, 256 }, { 626, 256 }, { 630, 256 }, { 906, 256 }, { 910, 256 }, { 914, 256 }, { 918, 256 }, { 1194, 256 }, { 1198, 256 }, { 1202, 256 }, { 1206, 256 }, { 1482, 256 }, { 1486, 256 }, { 1490, 256 }, { 1494, 256 }, { 66, 512 }, { 70, 512 }, { 74, 512 }, { 78, 512 }, { 354, 512 }, { 358, 512 }, { 362, 512 }, { 366, 512 }, { 642, 512 }, { 646, 512 }, { 650, 512 }, { 654, 512 }, { 930, 512 }, { 934, 512 }, { 938, 512 }, { 942, 512 }, { 1218, 512 }, { 1222, 512 }, { 1226, 512 }, { 1230, 512 }, { 1506, 512 }, { 1510, 512 }, { 1514, 512 }, { 1518, 512 }, { 90, 768 }, { 94, 768 }, { 98, 768 }, { 102, 768 }, { 378, 768 }, { 382, 768 }, { 386, 768 }, { 390, 768 }, { 666, 768 }, { 670, 768 }, { 674, 768 }, { 678, 768 }, { 954, 768 }, { 958, 768 }, { 962, 768 }, { 966, 768 }, { 1242, 768 }, { 1246, 768 }, { 1250, 768 }, { 1254, 768 }, { 1530, 768 }, { 1534, 768 }, { 1538, 768 }, { 1542, 768 }, { 114, 1024 }, { 118, 1024 }, { 122, 1024 }, { 126, 1024 }, { 402, 1024 }, { 406, 1024 }, { 410, 1024 }, { 414, 1024 }, { 690, 1024 }, { 694, 1024 }, { 698, 1024 }, { 702, 1024 }, { 978, 1024 }, { 982, 1024 }, { 986, 1024 }, { 990, 1024 }, { 1266, 1024 }, { 1270, 1024 }, { 1274, 1024 }, { 1278, 1024 }, { 1554, 1024 }, { 1558, 1024 }, { 1562, 1024 }, { 1566, 1024 }, { 138, 1536 }, { 142, 1536 }, { 146, 1536 }, { 150, 1536 }, { 426, 1536 }, { 430, 1536 }, { 434, 1536 }, { 438, 1536 }, { 714, 1536 }, { 718, 1536 }, { 722, 1536 }, { 726, 1536 }, { 1002, 1536 }, { 1006, 1536 }, { 1010, 1536 }, { 1014, 1536 }, { 1290, 1536 }, { 1294, 1536 }, { 1298, 1536 }, { 1302, 1536 }, { 1578, 1536 }, { 1582, 1536 }, { 1586, 1536 }, { 1590, 1536 }, { 162, 2048 }, { 166, 2048 }, { 170, 2048 }, { 174, 2048 }, { 450, 2048 }, { 454, 2048 }, { 458, 2048 }, { 462, 2048 }, { 738, 2048 }, { 742, 2048 }, { 746, 2048 }, { 750, 2048 }, { 1026, 2048 }, { 1030, 2048 }, { 1034, 2048 }, { 1038, 2048 }, { 1314, 2048 }, { 1318, 2048 }, { 1322, 2048 }, { 1326, 2048 }, { 1602, 2048 }, { 1606, 2048 }, { 1610, 2048 }, { 1614, 2048 }, { 186, 3072 }, { 190, 3072 }, { 194, 3072 }, { 198, 3072 }, { 474, 3072 }, { 478, 3072 }, { 482, 3072 }, { 486, 3072 }, { 762, 3072 }, { 766, 3072 }, { 770, 3072 }, { 774, 3072 }, { 1050, 3072 }, { 1054, 3072 }, { 1058, 3072 }, { 1062, 3072 }, { 1338, 3072 }, { 1342, 3072 }, { 1346, 3072 }, { 1350, 3072 }, { 1626, 3072 }, { 1630, 3072 }, { 1634, 3072 }, { 1638, 3072 }, { 210, 4096 }, { 214, 4096 }, { 218, 4096 }, { 222, 4096 }, { 498, 4096 }, { 502, 4096 }, { 506, 4096 }, { 510, 4096 }, { 786, 4096 }, { 790, 4096 }, { 794, 4096 }, { 798, 4096 }, { 1074, 4096 }, { 1078, 4096 }, { 1082, 4096 }, { 1086, 4096 }, { 1362, 4096 }, { 1366, 4096 }, { 1370, 4096 }, { 1374, 4096 }, { 1650, 4096 }, { 1654, 4096 }, { 1658, 4096 }, { 1662, 4096 }, { 234, 6144 }, { 238, 6144 }, { 242, 6144 }, { 246, 6144 }, { 522, 6144 }, { 526, 6144 }, { 530, 6144 }, { 534, 6144 }, { 810, 6144 }, { 814, 6144 }, { 818, 6144 }, { 822, 6144 }, { 1098, 6144 }, { 1102, 6144 }, { 1106, 6144 }, { 1110, 6144 }, { 1386, 6144 }, { 1390, 6144 }, { 1394, 6144 }, { 1398, 6144 }, { 1674, 6144 }, { 1678, 6144 }, { 1682, 6144 }, { 1686, 6144 }, { 258, 8192 }, { 262, 8192 }, { 266, 8192 }, { 270, 8192 }, { 546, 8192 }, { 550, 8192 }, { 554, 8192 }, { 558, 8192 }, { 834, 8192 }, { 838, 8192 }, { 842, 8192 }, { 846, 8192 }, { 1122, 8192 }, { 1126, 8192 }, { 1130, 8192 }, { 1134, 8192 }, { 1410, 8192 }, { 1414, 8192 }, { 1418, 8192 }, { 1422, 8192 }, { 1698, 8192 }, { 1702, 8192 }, { 1706, 8192 }, { 1710, 8192 }, { 282, 12288 }, { 286, 12288 }, { 290, 12288 }, { 294, 12288 }, { 570, 12288 }, { 574, 12288 }, { 578, 12288 }, { 582, 12288 }, { 858, 12288 }, { 862, 12288 }, { 866, 12288 }, { 870, 12288 }, { 1146, 12288 }, { 1150, 12288 }, { 1154, 12288 }, { 1158, 12288 }, { 1434, 12288 }, { 1438, 12288 }, { 1442, 12288 }, { 1446, 12288 }, { 1722, 12288 }, { 1726, 12288 }, { 1730, 12288 }, { 1734, 12288 } }, format = { number = "%.2f", behind = " kbps", real = true, width = 0 } },
+            { key = "Reverse Link", filter = "data_rates.reverse_link", computation = "data rate", formula = "growth of the weighted sum of the counters since the packet before, divided by 1024 x the growth of the sequence number; empty at the first packet, unchanged where the number has not grown", read = { { byte = 14, length = 4 }, { byte = 18, length = 1720 } }, counters = { { 18, 128 }, { 22, 128 }, { 26, 128 }, { 30, 128 }, { 306, 128 }, { 310, 128 }, { 314, 128 }, { 318, 128 }, { 594, 128 }, { 598, 128 }, { 602, 128 }, { 606, 128 }, { 882, 128 }, { 886, 128 }, { 890, 128 }, { 894, 128 }, { 1170, 128 }, { 1174, 128 }, { 1178, 128 }, { 1182, 128 }, { 1458, 128 }, { 1462, 128 }, { 1466, 128 }, { 1470, 128 }, { 42, 256 }, { 46, 256 }, { 50, 256 }, { 54, 256 }, { 330, 256 }, { 334, 256 }, { 338, 256 }, { 342, 256 }, { 618, 256 }, { 622, 256 }, { 626, 256 }, { 630, 256 }, { 906, 256 }, { 910, 256 }, { 914, 256 }, { 918, 256 }, { 1194, 256 }, { 1198, 256 }, { 1202, 256 }, { 1206, 256 }, { 1482, 256 }, { 1486, 256 }, { 1490, 256 }, { 1494, 256 }, { 66, 512 }, { 70, 512 }, { 74, 512 }, { 78, 512 }, { 354, 512 }, { 358, 512 }, { 362, 512 }, { 366, 512 }, { 642, 512 }, { 646, 512 }, { 650, 512 }, { 654, 512 }, { 930, 512 }, { 934, 512 }, { 938, 512 }, { 942, 512 }, { 1218, 512 }, { 1222, 512 }, { 1226, 512 }, { 1230, 512 }, { 1506, 512 }, { 1510, 512 }, { 1514, 512 }, { 1518, 512 }, { 90, 768 }, { 94, 768 }, { 98, 768 }, { 102, 768 }, { 378, 768 }, { 382, 768 }, { 386, 768 }, { 390, 768 }, { 666, 768 }, { 670, 768 }, { 674, 768 }, { 678, 768 }, { 954, 768 }, { 958, 768 }, { 962, 768 }, { 966, 768 }, { 1242, 768 }, { 1246, 768 }, { 1250, 768 }, { 1254, 768 }, { 1530, 768 }, { 1534, 768 }, { 1538, 768 }, { 1542, 768 }, { 114, 1024 }, { 118, 1024 }, { 122, 1024 }, { 126, 1024 }, { 402, 1024 }, { 406, 1024 }, { 410, 1024 }, { 414, 1024 }, { 690, 1024 }, { 694, 1024 }, { 698, 1024 }, { 702, 1024 }, { 978, 1024 }, { 982, 1024 }, { 986, 1024 }, { 990, 1024 }, { 1266, 1024 }, { 1270, 1024 }, { 1274, 1024 }, { 1278, 1024 }, { 1554, 1024 }, { 1558, 1024 }, { 1562, 1024 }, { 1566, 1024 }, { 138, 1536 }, { 142, 1536 }, { 146, 1536 }, { 150, 1536 }, { 426, 1536 }, { 430, 1536 }, { 434, 1536 }, { 438, 1536 }, { 714, 1536 }, { 718, 1536 }, { 722, 1536 }, { 726, 1536 }, { 1002, 1536 }, { 1006, 1536 }, { 1010, 1536 }, { 1014, 1536 }, { 1290, 1536 }, { 1294, 1536 }, { 1298, 1536 }, { 1302, 1536 }, { 1578, 1536 }, { 1582, 1536 }, { 1586, 1536 }, { 1590, 1536 }, { 162, 2048 }, { 166, 2048 }, { 170, 2048 }, { 174, 2048 }, { 450, 2048 }, { 454, 2048 }, { 458, 2048 }, { 462, 2048 }, { 738, 2048 }, { 742, 2048 }, { 746, 2048 }, { 750, 2048 }, { 1026, 2048 }, { 1030, 2048 }, { 1034, 2048 }, { 1038, 2048 }, { 1314, 2048 }, { 1318, 2048 }, { 1322, 2048 }, { 1326, 2048 }, { 1602, 2048 }, { 1606, 2048 }, { 1610, 2048 }, { 1614, 2048 }, { 186, 3072 }, { 190, 3072 }, { 194, 3072 }, { 198, 3072 }, { 474, 3072 }, { 478, 3072 }, { 482, 3072 }, { 486, 3072 }, { 762, 3072 }, { 766, 3072 }, { 770, 3072 }, { 774, 3072 }, { 1050, 3072 }, { 1054, 3072 }, { 1058, 3072 }, { 1062, 3072 }, { 1338, 3072 }, { 1342, 3072 }, { 1346, 3072 }, { 1350, 3072 }, { 1626, 3072 }, { 1630, 3072 }, { 1634, 3072 }, { 1638, 3072 }, { 210, 4096 }, { 214, 4096 }, { 218, 4096 }, { 222, 4096 }, { 498, 4096 }, { 502, 4096 }, { 506, 4096 }, { 510, 4096 }, { 786, 4096 }, { 790, 4096 }, { 794, 4096 }, { 798, 4096 }, { 1074, 4096 }, { 1078, 4096 }, { 1082, 4096 }, { 1086, 4096 }, { 1362, 4096 }, { 1366, 4096 }, { 1370, 4096 }, { 1374, 4096 }, { 1650, 4096 }, { 1654, 4096 }, { 1658, 4096 }, { 1662, 4096 }, { 234, 6144 }, { 238, 6144 }, { 242, 6144 }, { 246, 6144 }, { 522, 6144 }, { 526, 6144 }, { 530, 6144 }, { 534, 6144 }, { 810, 6144 }, { 814, 6144 }, { 818, 6144 }, { 822, 6144 }, { 1098, 6144 }, { 1102, 6144 }, { 1106, 6144 }, { 1110, 6144 }, { 1386, 6144 }, { 1390, 6144 }, { 1394, 6144 }, { 1398, 6144 }, { 1674, 6144 }, { 1678, 6144 }, { 1682, 6144 }, { 1686, 6144 }, { 258, 8192 }, { 262, 8192 }, { 266, 8192 }, { 270, 8192 }, { 546, 8192 }, { 550, 8192 }, { 554, 8192 }, { 558, 8192 }, { 834, 8192 }, { 838, 8192 }, { 842, 8192 }, { 846, 8192 }, { 1122, 8192 }, { 1126, 8192 }, { 1130, 8192 }, { 1134, 8192 }, { 1410, 8192 }, { 1414, 8192 }, { 1418, 8192 }, { 1422, 8192 }, { 1698, 8192 }, { 1702, 8192 }, { 1706, 8192 }, { 1710, 8192 }, { 282, 12288 }, { 286, 12288 }, { 290, 12288 }, { 294, 12288 }, { 570, 12288 }, { 574, 12288 }, { 578, 12288 }, { 582, 12288 }, { 858, 12288 }, { 862, 12288 }, { 866, 12288 }, { 870, 12288 }, { 1146, 12288 }, { 1150, 12288 }, { 1154, 12288 }, { 1158, 12288 }, { 1434, 12288 }, { 1438, 12288 }, { 1442, 12288 }, { 1446, 12288 }, { 1722, 12288 }, { 1726, 12288 }, { 1730, 12288 }, { 1734, 12288 } }, format = { number = "%.2f", behind = " kbps", real = true, width = 0 } },
           },
         },
       },
@@ -1203,12 +1203,16 @@ computations["old frame errors"] = function(v, _, context)
   end)
 end
 
+-- Where the bytes of an extent are counted from.
+local function origin_of(context, extent)
+  if extent.of == "record" then return 0 end
+  return extent.of == "companion" and context.companion or context.start
+end
+
 local function values_of(context, field)
   local values = {}
   for index, extent in ipairs(field.read) do
-    local start = context.start
-    if extent.of == "record" then start = 0 end
-    if extent.of == "companion" then start = context.companion end
+    local start = origin_of(context, extent)
     if extent.length <= 4 then
       local position = whole_bytes(extent.byte, extent.length)
       values[index] = number_at(context.record, start, position)
@@ -1241,14 +1245,22 @@ local function holds(context, condition)
   return number >= condition.least and number <= condition.most
 end
 
+-- The bytes of a field; of a computed one from the first to the last that is read where its first
+-- extent lies.
 local function range_of_field(context, field)
   if field.position then
     local position = field.position
     return range_of(context.record, context.start + position.byte, byte_count(position))
   end
-  local extent = field.read[1]
-  local start = extent.of == "companion" and context.companion or context.start
-  return range_of(context.record, start + extent.byte, extent.length)
+  local of, first, last = field.read[1].of, math.huge, 0
+  for _, extent in ipairs(field.read) do
+    if extent.of == of then
+      first = math.min(first, extent.byte)
+      last = math.max(last, extent.byte + extent.length)
+    end
+  end
+  local start = origin_of(context, field.read[1])
+  return range_of(context.record, start + first, last - first)
 end
 
 -- The text that a field shows, and its number where that is one; nothing where it shows nothing.
@@ -1494,7 +1506,7 @@ local function add_header(technology, record, tree, code, name)
   local label = string.format("Log code: 0x%04X", code) .. (name and ", " .. name or "")
   tree:add(header.code, record(3, 2), code, label)
   tree:add(header.name, record(3, 2), name or "", "Name: " .. (name or "unknown"))
-  tree:add(header.length, record:range(), record:len())
+  tree:add(header.length, record:range(), record:len()):set_generated()
 end
 
 local function dissect_record(technology, buffer, pinfo, tree)
@@ -1564,7 +1576,7 @@ local function register(technology)
     type = ProtoField.uint8(technology.name .. ".type", "Log type", base.HEX),
     code = ProtoField.uint32(technology.name .. ".code", "Log code", base.HEX),
     name = ProtoField.string(technology.name .. ".name", "Name"),
-    length = ProtoField.uint32(technology.name .. ".length", "Length"),
+    length = ProtoField.uint32(technology.name .. ".length", "Record length"),
   }
   for _, field in pairs(technology.header) do fields[#fields + 1] = field end
   proto.fields = fields

@@ -108,12 +108,16 @@ computations["old frame errors"] = function(v, _, context)
   end)
 end
 
+-- Where the bytes of an extent are counted from.
+local function origin_of(context, extent)
+  if extent.of == "record" then return 0 end
+  return extent.of == "companion" and context.companion or context.start
+end
+
 local function values_of(context, field)
   local values = {}
   for index, extent in ipairs(field.read) do
-    local start = context.start
-    if extent.of == "record" then start = 0 end
-    if extent.of == "companion" then start = context.companion end
+    local start = origin_of(context, extent)
     if extent.length <= 4 then
       local position = whole_bytes(extent.byte, extent.length)
       values[index] = number_at(context.record, start, position)

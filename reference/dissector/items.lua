@@ -22,14 +22,22 @@ local function holds(context, condition)
   return number >= condition.least and number <= condition.most
 end
 
+-- The bytes of a field; of a computed one from the first to the last that is read where its first
+-- extent lies.
 local function range_of_field(context, field)
   if field.position then
     local position = field.position
     return range_of(context.record, context.start + position.byte, byte_count(position))
   end
-  local extent = field.read[1]
-  local start = extent.of == "companion" and context.companion or context.start
-  return range_of(context.record, start + extent.byte, extent.length)
+  local of, first, last = field.read[1].of, math.huge, 0
+  for _, extent in ipairs(field.read) do
+    if extent.of == of then
+      first = math.min(first, extent.byte)
+      last = math.max(last, extent.byte + extent.length)
+    end
+  end
+  local start = origin_of(context, field.read[1])
+  return range_of(context.record, start + first, last - first)
 end
 
 -- The text that a field shows, and its number where that is one; nothing where it shows nothing.

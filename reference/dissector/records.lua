@@ -84,7 +84,7 @@ local function add_header(technology, record, tree, code, name)
   local label = string.format("Log code: 0x%04X", code) .. (name and ", " .. name or "")
   tree:add(header.code, record(3, 2), code, label)
   tree:add(header.name, record(3, 2), name or "", "Name: " .. (name or "unknown"))
-  tree:add(header.length, record:range(), record:len())
+  tree:add(header.length, record:range(), record:len()):set_generated()
 end
 
 local function dissect_record(technology, buffer, pinfo, tree)
@@ -154,7 +154,7 @@ local function register(technology)
     type = ProtoField.uint8(technology.name .. ".type", "Log type", base.HEX),
     code = ProtoField.uint32(technology.name .. ".code", "Log code", base.HEX),
     name = ProtoField.string(technology.name .. ".name", "Name"),
-    length = ProtoField.uint32(technology.name .. ".length", "Length"),
+    length = ProtoField.uint32(technology.name .. ".length", "Record length"),
   }
   for _, field in pairs(technology.header) do fields[#fields + 1] = field end
   proto.fields = fields

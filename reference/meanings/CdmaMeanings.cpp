@@ -25,7 +25,7 @@ constexpr auto kMeanings = std::to_array<Meaning>({
 
     {kOneX, "", "State and radio of the 1x device."},
     {kOneX, "Device State", "State of the 1x device."},
-    {kOneX, "Frame Error Rate", "Share of frames in error on the forward traffic channel, averaged over the call."},
+    {kOneX, "Frame Error Rate", "Share of frames in error on the forward traffic channel: a moving average in which the newest frame weighs 1/64."},
     {kOneX, "Transmit AGC", "Gain control of the transmitter: the power sent, while in Traffic."},
     {kOneX, "Active Set", "Pilots of the active set by their PN offset, each with its Ec/Io."},
 
@@ -34,7 +34,7 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kReceiver0, "Channel", "CDMA channel number that the receiver is tuned to."},
     {kReceiver0, "AGC", "Gain control of the receiver: the power received."},
 
-    {kReceiver1, "", "The second receiver of the 1x device, which is in use while in Traffic."},
+    {kReceiver1, "", "The second receiver of the 1x device, shown while in Traffic."},
     {kReceiver1, "Band Class", "Band class that the receiver is tuned to."},
     {kReceiver1, "Channel", "CDMA channel number that the receiver is tuned to."},
     {kReceiver1, "AGC", "Gain control of the receiver: the power received."},

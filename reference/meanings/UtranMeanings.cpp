@@ -31,8 +31,8 @@ constexpr auto kMeanings = std::to_array<Meaning>({
 
     {kNeighbors, "", "The neighbours of UTRAN."},
     {kNeighbors, "UARFCN", "UARFCN of the neighbour."},
-    {kNeighbors, "Cell ID", "Number of the neighbour in the record, 7 bits: not the cell identity of the network."},
-    {kNeighbors, "Filter RSCP", "Received signal code power behind the filter, as the modem counts it; its unit is not known."},
+    {kNeighbors, "Cell ID", "Identity by which the modem tells the neighbour, 7 bits; not the network's cell identity."},
+    {kNeighbors, "Filter RSCP", "Received signal code power after the filter, as the modem counts it; its unit is not known."},
     {kNeighbors, "Status", "Set that the cell belongs to: active (ASET), monitored (MSET) or detected (DSET)."},
     {kNeighbors, "inJDCS", "Whether the cell is in the JDCS; the record gives no more than the name."},
 

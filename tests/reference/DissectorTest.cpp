@@ -326,15 +326,15 @@ TEST_F(Dissector, TellsHeaderAndLogCode) {
         return labels;
     };
     using Labels = std::vector<std::string>;
-    EXPECT_EQ(labelsOf(0),
-              (Labels{"LTE log record", "Log type: 0x01",
-                      "Log code: 0xB0C1, Antennas of the serving cell",
-                      "Name: Antennas of the serving cell", "Length: 22", "Serving Cell Info"}));
+    EXPECT_EQ(labelsOf(0), (Labels{"LTE log record", "Log type: 0x01",
+                                   "Log code: 0xB0C1, Antennas of the serving cell",
+                                   "Name: Antennas of the serving cell", "[Record length: 22]",
+                                   "Serving Cell Info"}));
     EXPECT_EQ(labelsOf(1), (Labels{"LTE log record", "Log type: 0x01", "Log code: 0xB099",
-                                   "Name: unknown", "Length: 22"}));
+                                   "Name: unknown", "[Record length: 22]"}));
     EXPECT_EQ(labelsOf(2), (Labels{"LTE log record (invalid log type)", "Log type: 0x07",
                                    "Log code: 0xB0C1, Antennas of the serving cell",
-                                   "Name: Antennas of the serving cell", "Length: 22"}));
+                                   "Name: Antennas of the serving cell", "[Record length: 22]"}));
     EXPECT_EQ(labelsOf(3), (Labels{"LTE log record (too short)"}));
     EXPECT_EQ(labelsOf(4), (Labels{"LTE log record (too short)"}));
 }

@@ -1,23 +1,17 @@
 #include "reference/ReferenceFiles.h"
 
 #include "host/DirectoryResources.h"
+#include "tests/packaging/Shell.h"
 
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <set>
 
 namespace pallax {
 namespace {
 
 const std::filesystem::path kTree = PALLAX_SOURCE_DIR;
-
-std::string contentOf(const std::filesystem::path& path) {
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-}
 
 std::vector<ReferenceFile> files() {
     return referenceFiles(DirectoryResources((kTree / "resources").string()),
@@ -26,7 +20,7 @@ std::vector<ReferenceFile> files() {
 
 TEST(ReferenceFiles, TheTreeHoldsThemAsTheyAreWrittenNow) {
     for (const ReferenceFile& file : files()) {
-        EXPECT_TRUE(contentOf(kTree / file.path) == file.text)
+        EXPECT_TRUE(doubles::contentOf(kTree / file.path) == file.text)
             << file.path << " is not what the records' tables make of it. Write it anew:\n"
             << "  ninja -C build/dev make_reference && build/dev/reference/make_reference .";
     }
