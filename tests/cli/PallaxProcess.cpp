@@ -94,7 +94,7 @@ std::vector<std::string> programEnvironment(const World& world) {
 }
 
 bool eventually(const std::function<bool()>& condition) {
-    return within(seconds(10), condition);
+    return within(seconds(30), condition);
 }
 
 bool noChildLeft() {
@@ -137,7 +137,7 @@ PallaxProcess::~PallaxProcess() {
 int PallaxProcess::wait() {
     int status = 0;
     const bool ended =
-        within(seconds(20), [&] { return ::waitpid(_process, &status, WNOHANG) == _process; });
+        within(seconds(60), [&] { return ::waitpid(_process, &status, WNOHANG) == _process; });
     if (!ended) {
         ADD_FAILURE() << "it does not end\n" << out() << err();
         signal(SIGKILL);

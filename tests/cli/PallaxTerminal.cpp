@@ -19,7 +19,7 @@ namespace pallax::doubles {
 
 namespace {
 
-constexpr std::chrono::seconds kPatience{10};
+constexpr std::chrono::seconds kPatience{30};
 
 winsize sizeOf(int columns, int rows) {
     winsize size{};

@@ -33,22 +33,6 @@ TYPED_TEST(RecordDescriptions, EveryRecordDescribesTheCodesThatItWants) {
     }
 }
 
-TYPED_TEST(RecordDescriptions, WhatIsReadBehindNoConditionLiesWithinTheLeastLength) {
-    doubles::FakeStandardOutput output;
-    const TypeParam index(output);
-    for (const auto& [section, record] : index.classes()) {
-        for (const CodeDescription& code : record->describe()) {
-            for (const FieldDescription& field : code.fields) {
-                if (field.position && !field.condition) {
-                    const Extent extent = extentOf(*field.position);
-                    EXPECT_LE(extent.byte + extent.length, code.minimumLength)
-                        << section << ", " << field.key;
-                }
-            }
-        }
-    }
-}
-
 TEST(Descriptions, EveryFieldTellsWhereItComesFrom) {
     for (const TechnologyReference& technology : doubles::reference()) {
         for (const SectionReference& section : technology.sections) {
