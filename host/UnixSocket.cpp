@@ -3,6 +3,8 @@
 #include <array>
 #include <cerrno>
 #include <cstring>
+#include <linux/sockios.h>
+#include <sys/ioctl.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
 #include <sys/uio.h>
@@ -120,6 +122,12 @@ Transfer sendTo(const Descriptor& socket, Bytes first, Bytes second) {
     message.msg_iov = parts.data();
     message.msg_iovlen = parts.size();
     return outcome(::sendmsg(socket.number(), &message, MSG_NOSIGNAL));
+}
+
+std::size_t unreadByReceiver(const Descriptor& socket) {
+    int bytes = 0;
+    const bool isKnown = ::ioctl(socket.number(), SIOCOUTQ, &bytes) == 0 && bytes > 0;
+    return isKnown ? static_cast<std::size_t>(bytes) : 0;
 }
 
 } // namespace pallax

@@ -36,5 +36,8 @@ struct Transfer {
 Transfer receiveFrom(const Descriptor& socket, std::span<std::uint8_t> buffer);
 /// Both parts as one stream of bytes; `count` is over both.
 Transfer sendTo(const Descriptor& socket, Bytes first, Bytes second = {});
+/// What was sent and lies unread in the receiver's buffer, in bytes with what the kernel needs for
+/// them; 0 when the receiver has read everything.
+std::size_t unreadByReceiver(const Descriptor& socket);
 
 } // namespace pallax

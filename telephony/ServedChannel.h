@@ -42,8 +42,8 @@ public:
     ServedChannel& operator=(const ServedChannel&) = delete;
 
     ServiceStatus::Client status() const;
-    /// True while the client waits for more: it has started the stream, and no end was told.
-    bool isStreaming() const { return _isStreaming; }
+    /// Bytes that were sent, and that the client has not read yet.
+    std::size_t untaken() const { return _sink->untaken(); }
 
 private:
     ServedChannel(std::unique_ptr<PacketSource> source, std::unique_ptr<SocketSink> sink,

@@ -99,15 +99,20 @@ TelephonyServer::Setup serverSetup(const ServiceOptions& options, AsioMainQueue&
     return setup;
 }
 
-/// Stops the queue once the clients have been told the end, or take too long to hear it.
+/// Stops the queue once the clients have heard the end and gone, or read nothing for too long: a
+/// client that sees the service gone gives up what it has not yet come to.
 class LastWords {
 public:
     explicit LastWords(AsioMainQueue& queue) : _queue(queue) {}
 
     void begin(const TelephonyServer& server) {
         _looks = _queue.scheduleRepeating(kLook, [this, &server] {
-            _waited += kLook;
-            if (!server.isStreaming() || _waited >= kPatience) {
+            const std::size_t untaken = server.untaken();
+            _waited = untaken < _untaken ? kLook : _waited + kLook;
+            _waitedAtAll += kLook;
+            _untaken = untaken;
+            const bool haveAllGone = server.channelCount() == 0;
+            if (haveAllGone || _waited >= kPatience || _waitedAtAll >= kMostPatience) {
                 _queue.stop();
             }
         });
@@ -115,11 +120,14 @@ public:
 
 private:
     static constexpr std::chrono::milliseconds kLook{20};
-    static constexpr std::chrono::milliseconds kPatience{2000};
+    static constexpr std::chrono::milliseconds kPatience{2000}; // with nothing read
+    static constexpr std::chrono::milliseconds kMostPatience{30000};
 
     AsioMainQueue& _queue;
     std::unique_ptr<RepeatingTimer> _looks;
-    std::chrono::milliseconds _waited{0};
+    std::chrono::milliseconds _waited{0}; // since something was read
+    std::chrono::milliseconds _waitedAtAll{0};
+    std::size_t _untaken = 0;
 };
 
 int serve(const ServiceOptions& options, const std::function<void()>& ready,

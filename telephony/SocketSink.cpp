@@ -46,6 +46,10 @@ bool SocketSink::hasRoomFor(std::size_t size) const {
     return !_setup.mostWaiting || waiting == 0 || waiting + size <= *_setup.mostWaiting;
 }
 
+std::size_t SocketSink::untaken() const {
+    return _chunk.size() - _chunkSent + _next.size() + unreadByReceiver(_socket);
+}
+
 void SocketSink::drop() {
     ++_dropped;
     if (!std::exchange(_isBehind, true)) {

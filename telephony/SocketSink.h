@@ -39,6 +39,8 @@ public:
     std::size_t pending() const override { return _unflushed; }
     void flush(std::function<void()> done) override;
 
+    /// Bytes that the receiver has not read yet, wherever they wait.
+    std::size_t untaken() const;
     std::uint64_t sent() const { return _packets; }    ///< packets, those included that wait
     std::uint64_t dropped() const { return _dropped; } ///< packets
 

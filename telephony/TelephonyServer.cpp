@@ -5,7 +5,6 @@
 #include "platform/Format.h"
 #include "telephony/ServedChannel.h"
 
-#include <algorithm>
 #include <cerrno>
 
 namespace pallax {
@@ -105,9 +104,12 @@ void TelephonyServer::removeChannel(int number) {
     _channels.erase(found);
 }
 
-bool TelephonyServer::isStreaming() const {
-    return std::any_of(_channels.begin(), _channels.end(),
-                       [](const auto& entry) { return entry.second->isStreaming(); });
+std::size_t TelephonyServer::untaken() const {
+    std::size_t bytes = 0;
+    for (const auto& entry : _channels) {
+        bytes += entry.second->untaken();
+    }
+    return bytes;
 }
 
 ServiceStatus TelephonyServer::status() const {

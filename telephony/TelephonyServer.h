@@ -58,8 +58,8 @@ public:
     TelephonyServer& operator=(const TelephonyServer&) = delete;
 
     std::size_t channelCount() const { return _channels.size(); }
-    /// True while a client that has started its stream has not been told its end.
-    bool isStreaming() const;
+    /// Bytes that were sent, and that their clients have not read yet.
+    std::size_t untaken() const;
     ServiceStatus status() const;
 
 private:

@@ -8,6 +8,7 @@
 #include <fstream>
 #include <optional>
 #include <sys/stat.h>
+#include <thread>
 
 namespace pallax {
 namespace {
@@ -149,6 +150,23 @@ TEST_F(EndToEndRelay, AClientThatTakesNothingKeepsNobodyWaitingNotEvenTheEnd) {
     stopped.signal(SIGTERM);
     EXPECT_EQ(stopped.wait(), 0);
     EXPECT_GT(packetsIn(file), packetsIn(world.path("stopped.pcapng")));
+}
+
+TEST_F(EndToEndRelay, AClientThatComesLateToTheEndStillHearsEverything) {
+    constexpr int kPackets = 1000; // all of which the socket holds
+    const std::string file = world.path("a.pcapng");
+    PallaxProcess recorder(world, {"record", file});
+    ASSERT_TRUE(clientsStream(1));
+    recorder.signal(SIGSTOP);
+    for (int count = 0; count < kPackets; ++count) {
+        send(seconds(count), 0);
+    }
+    device.reset();
+    std::this_thread::sleep_for(std::chrono::milliseconds(500));
+    recorder.signal(SIGCONT);
+    EXPECT_EQ(recorder.wait(), 0);
+    EXPECT_EQ(service->wait(), 0);
+    EXPECT_EQ(packetsIn(file), kPackets);
 }
 
 TEST_F(EndToEndRelay, AStreamThatBreaksOffInAPacketIsAFailure) {
