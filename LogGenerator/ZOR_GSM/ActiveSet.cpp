@@ -67,6 +67,7 @@ Array ActiveSet::cellsOf(const LogRecord& record) const {
 
 RecordDescription ActiveSet::describe() const {
     std::vector<Extent> energies;
+    energies.reserve(kEnergyOffsets.size());
     for (const std::size_t offset : kEnergyOffsets) {
         energies.push_back(extentOf(u32At(offset), Extent::Origin::Companion));
     }
