@@ -13,7 +13,7 @@ namespace pallax {
 namespace {
 
 constexpr std::string_view kTitleWithoutNode = "Pallax";
-constexpr const char* kCellIdentifier = "PallaxPaneControllerCell";
+constexpr const char* kPaneCellIdentifier = "PallaxPaneControllerCell";
 constexpr ui::Font kStatusFont{ui::FontFace::System, 14};
 
 ui::Label statusLabel(const std::string& status, const ui::TextMetrics& metrics) {
@@ -52,7 +52,7 @@ void setText(const std::shared_ptr<ui::Label>& label, std::string text) {
 
 /// The cell that the table has to spare, whatever kind it was made as.
 std::shared_ptr<PallaxCell> reusableCell(ui::TableView& table) {
-    return std::dynamic_pointer_cast<PallaxCell>(table.dequeueReusableCell(kCellIdentifier));
+    return std::dynamic_pointer_cast<PallaxCell>(table.dequeueReusableCell(kPaneCellIdentifier));
 }
 
 } // namespace
@@ -126,7 +126,7 @@ std::shared_ptr<ui::TableCell> PallaxPaneController::cellForRow(std::size_t row)
     std::shared_ptr<PallaxCell> cell = reusableCell(table());
     if (!cell) {
         const auto kind = isBranch ? PallaxCell::Kind::Branch : PallaxCell::Kind::Leaf;
-        cell = std::make_shared<PallaxCell>(kind, kCellIdentifier, _toolkit.textMetrics());
+        cell = std::make_shared<PallaxCell>(kind, kPaneCellIdentifier, _toolkit.textMetrics());
         cell->setContentBounds(table().contentBounds());
     }
     setText(cell->key(), child->displayName());

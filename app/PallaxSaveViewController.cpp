@@ -13,7 +13,7 @@ namespace pallax {
 namespace {
 
 constexpr std::string_view kLayoutName = "PallaxSaveViewController";
-constexpr const char* kCellIdentifier = "SaveHistoryContentCell";
+constexpr const char* kSaveCellIdentifier = "SaveHistoryContentCell";
 constexpr ui::Font kItemFont{ui::FontFace::Helvetica, 13};
 constexpr std::string_view kDescriptionKey = "Description";
 
@@ -100,9 +100,10 @@ std::string PallaxSaveViewController::descriptionOf(std::size_t row) const {
 }
 
 std::shared_ptr<ui::TableCell> PallaxSaveViewController::cellForRow(std::size_t row) {
-    std::shared_ptr<ui::TableCell> cell = saveContentTable().dequeueReusableCell(kCellIdentifier);
+    std::shared_ptr<ui::TableCell> cell =
+        saveContentTable().dequeueReusableCell(kSaveCellIdentifier);
     if (!cell) {
-        cell = std::make_shared<ui::TableCell>(ui::CellStyle::Plain, kCellIdentifier);
+        cell = std::make_shared<ui::TableCell>(ui::CellStyle::Plain, kSaveCellIdentifier);
         cell->setContentBounds(saveContentTable().contentBounds());
     }
     cell->textLabel().text = descriptionOf(row);

@@ -22,9 +22,6 @@ namespace pallax {
 
 namespace {
 
-/// What the machine's log gets: failures. Every packet makes several lines of less urgency.
-constexpr int kSyslogLevel = static_cast<int>(LogPriority::Error);
-
 /// Ends the child, and says what it had to complain of; true when that was nothing.
 bool endChild(ChildService& child) {
     child.stop();

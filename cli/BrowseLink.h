@@ -10,6 +10,7 @@
 #include "monitor/PallaxModel.h"
 #include "telephony/SocketTelephonyService.h"
 
+#include <chrono>
 #include <string>
 
 namespace pallax {
@@ -21,6 +22,9 @@ class StandardOutput;
 /// service (a child's or the machine's), the source's clock, and the templates.
 class BrowseLink {
 public:
+    /// How often a browser looks at the connection, and whether the child service is still there.
+    static constexpr std::chrono::milliseconds kLookInterval{500};
+
     /// `child` is null for the machine's own service; a child's clients get names of their own,
     /// made of `localPortName`. What is referred to outlives the link.
     BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,

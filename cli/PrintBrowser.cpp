@@ -8,13 +8,6 @@
 
 namespace pallax {
 
-namespace {
-
-/// How often the connection and the child service are looked at.
-constexpr std::chrono::milliseconds kLookInterval{500};
-
-} // namespace
-
 void PrintBrowser::Notices::printLine(std::string_view line) {
     _output.text() += line;
     _output.text() += '\n';
@@ -37,7 +30,7 @@ bool PrintBrowser::run() {
         _model.startMonitor();
         _printer.showConnection(_model.isConnected());
     });
-    const auto looks = queue.scheduleRepeating(kLookInterval, [this] { look(); });
+    const auto looks = queue.scheduleRepeating(BrowseLink::kLookInterval, [this] { look(); });
     queue.run();
     return !_childLost;
 }
@@ -46,7 +39,7 @@ void PrintBrowser::look() {
     _printer.showConnection(_model.isConnected());
     if (_link.childHasEnded()) {
         // A signal to the whole process group may be on its way to us too.
-        _link.queue().after(kLookInterval, [this] {
+        _link.queue().after(BrowseLink::kLookInterval, [this] {
             _childLost = true;
             _link.queue().stop();
         });

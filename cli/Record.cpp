@@ -14,8 +14,6 @@ namespace pallax {
 
 namespace {
 
-/// What the machine's log gets: failures.
-constexpr int kSyslogLevel = static_cast<int>(LogPriority::Error);
 constexpr int kNothing = -1;
 
 ExitStatus record(const RecordOptions& options) {

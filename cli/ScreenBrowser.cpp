@@ -11,8 +11,6 @@ namespace pallax {
 namespace {
 
 constexpr std::chrono::milliseconds kTurnInterval{150};
-/// How often it is looked whether the child service is still there.
-constexpr std::chrono::milliseconds kLookInterval{500};
 
 } // namespace
 
@@ -79,7 +77,7 @@ bool ScreenBrowser::run() {
     _frontEnd.resize(_terminal.columns(), _terminal.rows());
     _app.applicationDidFinishLaunching();
     waitForKey();
-    const auto looks = queue.scheduleRepeating(kLookInterval, [this] { look(); });
+    const auto looks = queue.scheduleRepeating(BrowseLink::kLookInterval, [this] { look(); });
     queue.run();
     return !_childLost;
 }
@@ -129,7 +127,7 @@ void ScreenBrowser::adoptSize() {
 void ScreenBrowser::look() {
     if (_link.childHasEnded()) {
         // A signal to the whole process group may be on its way to us too.
-        _link.queue().after(kLookInterval, [this] {
+        _link.queue().after(BrowseLink::kLookInterval, [this] {
             _childLost = true;
             _link.queue().stop();
         });

@@ -7,7 +7,7 @@ namespace pallax {
 
 namespace {
 
-constexpr std::size_t kIndentation = 2;
+constexpr std::size_t kIndentationPerLevel = 2;
 constexpr std::string_view kChanged = "* ";
 
 } // namespace
@@ -46,7 +46,7 @@ void TreePrinter::printChildren(const PallaxModelNode& node, const std::string& 
             printLeaf(*child, std::move(childsPath), depth, values);
             continue;
         }
-        _output.text().append(depth * kIndentation, ' ');
+        _output.text().append(depth * kIndentationPerLevel, ' ');
         appendPrintable(_output.text(), child->displayName());
         _output.text() += '\n';
         printChildren(*child, childsPath, depth + 1, values);
@@ -65,7 +65,7 @@ void TreePrinter::printLeaf(const PallaxModelNode& leaf, std::string path, std::
 
     std::string& text = _output.text();
     const std::size_t start = text.size();
-    text.append(depth * kIndentation, ' ');
+    text.append(depth * kIndentationPerLevel, ' ');
     if (changed) {
         text.replace(start, depth > 0 ? kChanged.size() : 0, kChanged);
     }

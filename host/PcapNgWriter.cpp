@@ -31,7 +31,6 @@ constexpr std::uint16_t kSectionProgram = 4;
 constexpr std::uint16_t kStampResolution = 9;
 
 constexpr char kNanoseconds = 9; // the stamps count units of 10 to the power of -9 s
-constexpr unsigned kBitsPerByte = 8;
 constexpr std::size_t kAlignment = 4;
 constexpr std::size_t kBlockFrame = 12; // type and both lengths
 constexpr std::size_t kPacketHead = 20; // of an enhanced packet's body, before the data
@@ -70,6 +69,7 @@ public:
 
 private:
     Block& put(std::uint64_t number, std::size_t width) {
+        constexpr unsigned kBitsPerByte = 8;
         for (std::size_t index = 0; index < width; ++index) {
             _bytes.push_back(static_cast<std::uint8_t>(number >> (index * kBitsPerByte)));
         }

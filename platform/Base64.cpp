@@ -22,7 +22,7 @@ constexpr std::array<std::uint8_t, 256> kDigits = [] {
     return digits;
 }();
 
-bool isSpace(char letter) {
+bool isBlank(char letter) {
     return letter == ' ' || letter == '\t' || letter == '\n' || letter == '\r';
 }
 
@@ -53,7 +53,7 @@ std::optional<ByteBuffer> parseBase64(std::string_view text) {
     std::size_t digits = 0;
     std::size_t padding = 0;
     for (const char letter : text) {
-        if (isSpace(letter)) {
+        if (isBlank(letter)) {
             continue;
         }
         if (letter == '=') {

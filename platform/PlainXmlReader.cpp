@@ -13,7 +13,7 @@ namespace pallax {
 
 namespace {
 
-constexpr bool isSpace(char letter) {
+constexpr bool isPlainSpace(char letter) {
     return letter == ' ' || letter == '\t' || letter == '\n';
 }
 
@@ -52,7 +52,7 @@ private:
     }
 
     void skipSpaces() {
-        while (!_rest.empty() && isSpace(_rest.front())) {
+        while (!_rest.empty() && isPlainSpace(_rest.front())) {
             _rest.remove_prefix(1);
         }
     }

@@ -1,11 +1,12 @@
 #include "platform/PropertyListCodec.h"
 
+#include "platform/Utf8.h"
+
 namespace pallax {
 
 namespace {
 
 constexpr std::string_view kBinarySignature = "bplist";
-constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
 constexpr std::string_view kSpaces = " \t\r\n";
 
 /// The first bytes as text, which is all that telling the forms apart needs.

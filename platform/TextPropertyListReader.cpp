@@ -10,10 +10,9 @@ namespace pallax {
 
 namespace {
 
-constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
 constexpr char32_t kLargestOctal = 0xFF;
 
-bool isSpace(char letter) {
+bool isSeparator(char letter) {
     return letter == ' ' || (letter >= '\t' && letter <= '\r');
 }
 
@@ -88,7 +87,7 @@ bool TextReader::take(char letter) {
 
 void TextReader::skipSpace() {
     while (!atEnd()) {
-        if (isSpace(peek())) {
+        if (isSeparator(peek())) {
             ++_at;
         } else if (!skipComment()) {
             return;
@@ -197,7 +196,7 @@ PropertyList TextReader::data() {
         if (atEnd()) {
             refuse(start, "data without its \">\"");
         }
-        if (isSpace(peek())) {
+        if (isSeparator(peek())) {
             continue;
         }
         const auto digit = hexDigit(peek());

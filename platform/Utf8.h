@@ -7,6 +7,9 @@
 
 namespace pallax {
 
+/// What a text file may begin with to say that it is UTF-8.
+constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
+
 /// One code point of a UTF-8 text and the bytes that it takes; 0 bytes where the text is no UTF-8.
 struct Utf8CodePoint {
     char32_t value = 0;

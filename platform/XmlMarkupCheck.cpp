@@ -17,7 +17,7 @@ constexpr std::string_view kUtf16LittleEndianMark = "\xFF\xFE";
 constexpr auto kEntities = std::to_array<std::string_view>({"amp", "lt", "gt", "quot", "apos"});
 
 /// A printable ASCII character or a new line or tabulator.
-constexpr bool isPlain(char letter) {
+constexpr bool needsNoCheck(char letter) {
     return (letter >= ' ' && letter <= '~') || letter == '\n' || letter == '\t';
 }
 
@@ -26,7 +26,7 @@ void checkCharacters(std::string_view xml) {
         refuse(0, "UTF-16, where only UTF-8 is read");
     }
     for (std::size_t at = 0; at < xml.size();) {
-        if (isPlain(xml[at])) { // almost every one; half of the check's time was utf8At's
+        if (needsNoCheck(xml[at])) { // almost every one; half of the check's time was utf8At's
             ++at;
             continue;
         }

@@ -2,6 +2,7 @@
 #include "platform/PlainXmlReader.h"
 #include "platform/PropertyListCodec.h"
 #include "platform/Refusal.h"
+#include "platform/Utf8.h"
 #include "platform/XmlMarkupCheck.h"
 
 #include <pugixml.hpp>
@@ -15,21 +16,19 @@ namespace pallax {
 
 namespace {
 
-constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
-
 // White space belongs to strings; what stands beside the root element must be seen to be refused.
 constexpr unsigned kParsing = pugi::parse_cdata | pugi::parse_escapes | pugi::parse_eol |
                               pugi::parse_ws_pcdata | pugi::parse_fragment;
 
-constexpr bool isSpace(char letter) {
+constexpr bool isXmlSpace(char letter) {
     return letter == ' ' || letter == '\t' || letter == '\r' || letter == '\n';
 }
 
 std::string_view trimmed(std::string_view text) {
-    while (!text.empty() && isSpace(text.front())) {
+    while (!text.empty() && isXmlSpace(text.front())) {
         text.remove_prefix(1);
     }
-    while (!text.empty() && isSpace(text.back())) {
+    while (!text.empty() && isXmlSpace(text.back())) {
         text.remove_suffix(1);
     }
     return text;

@@ -18,7 +18,7 @@ constexpr std::string_view kOpening = "<?xml version=\"1.0\" encoding=\"UTF-8\"?
 constexpr std::string_view kClosing = "</plist>\n";
 
 /// Stands in XML as it is, whatever comes before and after it.
-bool isPlain(char letter) {
+bool needsNoEscape(char letter) {
     return letter >= ' ' && letter <= '~' && letter != '&' && letter != '<' && letter != '>';
 }
 
@@ -26,7 +26,7 @@ void appendEscaped(std::string& out, std::string_view text) {
     for (std::size_t at = 0; at < text.size();) {
         const auto rest = text.substr(at);
         const auto plain = static_cast<std::size_t>(
-            std::find_if_not(rest.begin(), rest.end(), isPlain) - rest.begin());
+            std::find_if_not(rest.begin(), rest.end(), needsNoEscape) - rest.begin());
         if (plain > 0) {
             out += rest.substr(0, plain);
             at += plain;

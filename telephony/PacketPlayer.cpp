@@ -13,7 +13,7 @@ namespace {
 
 constexpr std::size_t kChunkSize = std::size_t{64} << 10U;
 /// Unwanted packets write nothing: so many are passed over before other blocks get their turn.
-constexpr int kPacketsPerBlock = 1000;
+constexpr int kPacketsPerStep = 1000;
 
 std::chrono::nanoseconds scaled(std::chrono::nanoseconds time, double factor) {
     constexpr double kLongest = 1e18; // about 30 years
@@ -36,7 +36,7 @@ void PacketPlayer::play(CodeFilter filter) {
 
 /// One block's worth of playing.
 void PacketPlayer::step() {
-    for (int count = 0; count < kPacketsPerBlock; ++count) {
+    for (int count = 0; count < kPacketsPerStep; ++count) {
         if (!_packet && !_sourceEnded && fetch() == Progress::Wait) {
             return;
         }

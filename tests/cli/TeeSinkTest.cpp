@@ -7,7 +7,7 @@
 namespace pallax {
 namespace {
 
-class Lines final : public LogSink {
+class WrittenTexts final : public LogSink {
 public:
     void write(LogPriority /*priority*/, std::string_view text) override {
         texts.emplace_back(text);
@@ -16,8 +16,8 @@ public:
 };
 
 TEST(TeeSink, EachSinkGetsTheLinesUpToItsOwnLevel) {
-    Lines first;
-    Lines second;
+    WrittenTexts first;
+    WrittenTexts second;
     TeeSink both(first, 3, second, 6);
     both.write(LogPriority::Error, "error");
     both.write(LogPriority::Informational, "header");

@@ -9,7 +9,7 @@ namespace {
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-const Time kFirst{seconds(1700000000)};
+const Time kStart{seconds(1700000000)};
 
 struct Passed {
     std::uint64_t number;
@@ -24,28 +24,28 @@ std::optional<Passed> passedBefore(TickGrid& grid, Time packet) {
 
 TEST(TickGrid, ThePacketAtATicksTimeComesAfterTheTick) {
     TickGrid grid;
-    EXPECT_EQ(passedBefore(grid, kFirst), std::nullopt);
-    EXPECT_EQ(passedBefore(grid, kFirst + milliseconds(1999)), std::nullopt);
-    EXPECT_EQ(passedBefore(grid, kFirst + seconds(2)), (Passed{1, kFirst + seconds(2)}));
-    EXPECT_EQ(passedBefore(grid, kFirst + seconds(2)), std::nullopt);
+    EXPECT_EQ(passedBefore(grid, kStart), std::nullopt);
+    EXPECT_EQ(passedBefore(grid, kStart + milliseconds(1999)), std::nullopt);
+    EXPECT_EQ(passedBefore(grid, kStart + seconds(2)), (Passed{1, kStart + seconds(2)}));
+    EXPECT_EQ(passedBefore(grid, kStart + seconds(2)), std::nullopt);
     EXPECT_EQ(grid.next().number, 2U);
-    EXPECT_EQ(grid.next().time, kFirst + seconds(4));
+    EXPECT_EQ(grid.next().time, kStart + seconds(4));
 }
 
 TEST(TickGrid, OfSeveralTicksInAGapTheFirstIsTold) {
     TickGrid grid;
-    (void)grid.passedBefore(kFirst);
-    EXPECT_EQ(passedBefore(grid, kFirst + seconds(11)), (Passed{1, kFirst + seconds(2)}));
-    EXPECT_EQ(passedBefore(grid, kFirst + seconds(12)), (Passed{6, kFirst + seconds(12)}));
+    (void)grid.passedBefore(kStart);
+    EXPECT_EQ(passedBefore(grid, kStart + seconds(11)), (Passed{1, kStart + seconds(2)}));
+    EXPECT_EQ(passedBefore(grid, kStart + seconds(12)), (Passed{6, kStart + seconds(12)}));
 }
 
 TEST(TickGrid, TimeThatGoesBackwardsMakesNoTick) {
     TickGrid grid;
-    (void)grid.passedBefore(kFirst);
-    (void)grid.passedBefore(kFirst + seconds(5));
-    EXPECT_EQ(passedBefore(grid, kFirst - seconds(100)), std::nullopt);
-    EXPECT_EQ(passedBefore(grid, kFirst + seconds(3)), std::nullopt);
-    EXPECT_EQ(passedBefore(grid, kFirst + seconds(6)), (Passed{3, kFirst + seconds(6)}));
+    (void)grid.passedBefore(kStart);
+    (void)grid.passedBefore(kStart + seconds(5));
+    EXPECT_EQ(passedBefore(grid, kStart - seconds(100)), std::nullopt);
+    EXPECT_EQ(passedBefore(grid, kStart + seconds(3)), std::nullopt);
+    EXPECT_EQ(passedBefore(grid, kStart + seconds(6)), (Passed{3, kStart + seconds(6)}));
 }
 
 TEST(TickGrid, TheWholeRangeOfTimeIsOneStep) {
@@ -62,15 +62,15 @@ TEST(TickGrid, TheWholeRangeOfTimeIsOneStep) {
 TEST(TickGrid, GivesWhatSteppingGives) {
     EXPECT_TRUE(rc::check([](const std::vector<std::int16_t>& steps) {
         TickGrid grid;
-        Time packet = kFirst;
+        Time packet = kStart;
         std::uint64_t passed = 0;
         for (const std::int16_t& step : steps) {
             packet += milliseconds(step);
             if (&step == steps.data()) {
-                packet = kFirst;
+                packet = kStart;
             }
             const std::uint64_t before = passed;
-            while (packet >= kFirst + seconds(2) * static_cast<std::int64_t>(passed + 1)) {
+            while (packet >= kStart + seconds(2) * static_cast<std::int64_t>(passed + 1)) {
                 ++passed;
             }
             const auto tick = grid.passedBefore(packet);

@@ -5,10 +5,10 @@
 namespace pallax {
 namespace {
 
-constexpr NumberFormat kDbm{"%d dBm"};
+constexpr NumberFormat kShownDbm{"%d dBm"};
 
 TEST(PropertyList, ADisplayNumberIsAStringToWhoeverReadsIt) {
-    const PropertyList shown = DisplayNumber(std::int64_t{-80}, kDbm);
+    const PropertyList shown = DisplayNumber(std::int64_t{-80}, kShownDbm);
     EXPECT_TRUE(shown.isString());
     EXPECT_EQ(shown.string(), "-80 dBm");
     EXPECT_EQ(shown, PropertyList("-80 dBm"));

@@ -8,7 +8,7 @@
 namespace pallax {
 namespace {
 
-constexpr NumberFormat kDbm{"%d dBm"};
+constexpr NumberFormat kWrittenDbm{"%d dBm"};
 
 /// The line of one value.
 std::string written(const PropertyList& object) {
@@ -26,7 +26,7 @@ std::string written(const PropertyList& object) {
 TEST(XmlPropertyListWriter, WritesOneElementALine) {
     const PropertyList list = Dictionary{
         {"string", "a"},
-        {"<key>", DisplayNumber(std::int64_t{-80}, kDbm)},
+        {"<key>", DisplayNumber(std::int64_t{-80}, kWrittenDbm)},
         {"list", Array{PropertyList::integer(-5), PropertyList::boolean(true),
                        PropertyList::boolean(false), Array{}, Dictionary{}}},
         {"data", PropertyList::data({0x0F, 0xBD, 0x77, 0x00})},

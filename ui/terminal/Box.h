@@ -10,6 +10,9 @@ namespace pallax::terminal {
 
 /// A framed area; the extents count the frame.
 struct Box {
+    /// What the frame takes of the rows, and of the columns.
+    static constexpr int kFrame = 2;
+
     int x = 0;
     int y = 0;
     int columns = 0;

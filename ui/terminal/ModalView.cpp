@@ -16,7 +16,6 @@ constexpr std::string_view kFieldName = "Description";
 constexpr int kWidth = 76;
 /// Where less than this is inside the frame, names and buttons are shortened.
 constexpr int kNarrow = 28;
-constexpr int kFrameRows = 2;
 constexpr int kFieldAndButtons = 2;
 constexpr int kBlankRows = 2; // above and below the field, where there is room
 
@@ -25,11 +24,11 @@ constexpr int kBlankRows = 2; // above and below the field, where there is room
 void ModalView::draw(ui::ModalScreen& screen, ModalFocus focus) {
     const int listRows = static_cast<int>(screen.numberOfRows());
     const Box box =
-        centeredBox(_grid, kWidth, listRows + kFrameRows + kFieldAndButtons + kBlankRows);
+        centeredBox(_grid, kWidth, listRows + Box::kFrame + kFieldAndButtons + kBlankRows);
     drawBox(_grid, _marks, box, kTitle);
     _hits.clear(); // nothing under a modal screen can be touched
     _hits.add(0, 0, _grid.columns(), _grid.rows(), [&screen] { screen.backgroundTouched(); });
-    const int inner = box.rows - kFrameRows;
+    const int inner = box.rows - Box::kFrame;
     const int shown = std::clamp(inner - kFieldAndButtons, 0, listRows);
     const bool hasBlanks = inner >= shown + kFieldAndButtons + kBlankRows;
     drawList(screen, box, shown);
@@ -40,7 +39,7 @@ void ModalView::draw(ui::ModalScreen& screen, ModalFocus focus) {
 
 void ModalView::drawList(ui::ModalScreen& screen, const Box& box, int rows) {
     TerminalTable& table = terminalTable(screen.list());
-    table.setViewport(static_cast<std::size_t>(rows), rowContentBounds(box.columns - kFrameRows));
+    table.setViewport(static_cast<std::size_t>(rows), rowContentBounds(box.columns - Box::kFrame));
     const Span inside = box.inside();
     for (int row = 0; row < rows; ++row) {
         const std::size_t index = table.firstShown() + static_cast<std::size_t>(row);

@@ -13,8 +13,7 @@ namespace pallax::terminal {
 namespace {
 
 constexpr int kFrameColumns = 4; // frame and blanks
-constexpr int kFrameRows = 2;
-constexpr int kKeyColumns = 18; // of the help page
+constexpr int kKeyColumns = 18;  // of the help page
 
 struct Help {
     std::string_view keys;
@@ -70,7 +69,7 @@ void drawAlert(Grid& grid, const Marks& marks, const ui::Alert& alert) {
     const int inside = std::min(wanted + kFrameColumns, grid.columns()) - kFrameColumns;
     const std::vector<std::string> lines = wrapped(alert.message, inside);
     const int rows = static_cast<int>(lines.size()) + 1;
-    const Box box = centeredBox(grid, wanted + kFrameColumns, rows + kFrameRows);
+    const Box box = centeredBox(grid, wanted + kFrameColumns, rows + Box::kFrame);
     drawBox(grid, marks, box, alert.title);
     const int buttonRow = box.y + box.rows - 2;
     for (int row = 0; row < rows - 1 && box.y + 1 + row < buttonRow; ++row) {
@@ -109,9 +108,9 @@ int drawHelp(Grid& grid, const Marks& marks, int first) {
         columns = std::max(columns, columnsOf(line));
     }
     const Box box =
-        centeredBox(grid, columns + kFrameColumns, static_cast<int>(lines.size()) + kFrameRows);
+        centeredBox(grid, columns + kFrameColumns, static_cast<int>(lines.size()) + Box::kFrame);
     drawBox(grid, marks, box, "Keys");
-    const int shown = box.rows - kFrameRows;
+    const int shown = box.rows - Box::kFrame;
     const int begin = std::min(first, std::max(static_cast<int>(lines.size()) - shown, 0));
     for (int row = 0; row < shown; ++row) {
         const int index = begin + row;

@@ -11,7 +11,7 @@ namespace pallax::gsm {
 
 namespace {
 
-constexpr double kNoiseDb = 0.6;
+constexpr double kUmtsNoiseDb = 0.6;
 constexpr double kLeastEcnoDb = -20;
 constexpr std::size_t kMostCells = 6;
 
@@ -64,7 +64,7 @@ void reportSearcher(const Scenario& scenario, Random& random, ByteBuffer& out) {
     visitCells(scenario, [&](std::size_t index) {
         const double ecno = ecno_db(scenario, layer.level_dbm(index));
         cells[count++] = {layer.cells()[index].code, serves && index == layer.camped(),
-                          std::clamp(whole(measured(ecno, kNoiseDb, random)), -22, -1)};
+                          std::clamp(whole(measured(ecno, kUmtsNoiseDb, random)), -22, -1)};
     });
     encode(Searcher{whole(carrier_dbm), std::span(cells.data(), count)}, out);
 }
@@ -76,8 +76,9 @@ void reportUmtsRanking(const Scenario& scenario, Random& random, ByteBuffer& out
     std::size_t count = 0;
     visitCells(scenario, [&](std::size_t index) {
         const Cell& cell = layer.cells()[index];
-        const int rscp = whole(measured(layer.level_dbm(index), kNoiseDb, random));
-        const double ecno = measured(ecno_db(scenario, layer.level_dbm(index)), kNoiseDb, random);
+        const int rscp = whole(measured(layer.level_dbm(index), kUmtsNoiseDb, random));
+        const double ecno =
+            measured(ecno_db(scenario, layer.level_dbm(index)), kUmtsNoiseDb, random);
         cells[count++] = {cell.channel, cell.code, rscp, whole(2 * std::min(ecno, -0.5)) / 2.0,
                           rscp - kLeastRankDbm};
     });
