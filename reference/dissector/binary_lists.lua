@@ -27,7 +27,7 @@ local function open_binary(source)
     and source.count * source.offset_width == trailer - source.objects_end
     and source.root < source.count
   if not is_sound then refuse() end
-  source.open, source.scalars = {}, {}
+  source.scalars = {}
   source.payload = size + MOST_EXPANDED
 end
 
@@ -163,6 +163,7 @@ local function binary_scalar(source, offset, marker)
   return node
 end
 
+-- References in a circle end with the greatest depth.
 local function binary_value(source, offset, depth)
   count_value(source, depth)
   local marker = marker_at(source, offset)
@@ -171,8 +172,6 @@ local function binary_value(source, offset, depth)
     return binary_scalar(source, offset, marker)
   end
   content_of(source, marker, (is_dictionary and 2 or 1) * source.width)
-  if source.open[offset] then refuse() end -- a circle
-  source.open[offset] = true
   local function reference(index)
     local at = marker.content + index * source.width
     return offset_of(source, big_endian(source, at, source.width, source.objects_end))
@@ -192,7 +191,6 @@ local function binary_value(source, offset, depth)
       node.elements[index + 1] = binary_value(source, reference(index), depth + 1)
     end
   end
-  source.open[offset] = nil
   node.at, node.length = offset, marker.past - offset
   return node
 end
