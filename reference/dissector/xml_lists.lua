@@ -71,7 +71,7 @@ local function real_of(text)
   else
     local significand = digits:match("^([%d.]+)$") or digits:match("^([%d.]+)[eE][+-]?%d+$")
     local is_real = significand and significand:find("^%d*%.?%d*$") and significand:find("%d")
-    number = is_real and tonumber(digits) or refuse()
+    number = (is_real and tonumber(digits) or refuse()) + 0.0 -- a real also where Lua has integers
     local is_in_range = number > 0 and number < math.huge
     if not is_in_range and significand:find("[1-9]") then refuse() end
   end
