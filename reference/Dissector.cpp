@@ -58,15 +58,21 @@ public:
             writeCode(code);
         }
         line(2, "},");
+        if (name == kObjectStream) {
+            writeObjectKeys();
+        }
         line(1, "},");
         return std::move(_text);
     }
 
 private:
     static constexpr int kFirstUserLinkType = 147;
+    static constexpr std::string_view kObjectStream = "ifx"; ///< has no log codes
 
     static std::string framingOf(const std::string& commandName) {
-        return commandName == "ifx" ? "object" : commandName == "cdma" ? "any type" : "record";
+        return commandName == kObjectStream ? "object"
+               : commandName == "cdma"      ? "any type"
+                                            : "record";
     }
 
     void writeCode(LogCode logCode) {
@@ -93,14 +99,12 @@ private:
         if (code.condition) {
             head.raw("condition", luaCondition(*code.condition));
         }
-        if (!code.listPart.empty()) {
-            head.truth("property_list", true);
-        }
         line(4, "{");
         line(5, "head = " + head.str() + ",");
-        if (code.listPart.empty()) { // the keys of a property list are shown as they come
-            writeParts(5, code.fields, code.lists);
+        if (code.listPart) {
+            line(5, "list = " + luaListPart(*code.listPart) + ",");
         }
+        writeParts(5, code.fields, code.lists);
         if (!code.subpackets.empty()) {
             line(5, "subpackets = {");
             for (const SubpacketDescription& subpacket : code.subpackets) {
@@ -112,6 +116,21 @@ private:
             line(5, "},");
         }
         line(4, "},");
+    }
+
+    /// What is known to come in an object stream.
+    void writeObjectKeys() {
+        line(2, "objects = {");
+        for (const SectionReference& section : _technology.sections) {
+            _filter = filterWord(section.name);
+            LuaTable keys;
+            for (const std::string& key : section.objectKeys) {
+                keys.raw("[" + luaText(key) + "]", luaText(filterOf(key)));
+            }
+            line(3, "[" + luaText(section.name) + "] = { filter = " + luaText(_filter) +
+                        ", keys = " + keys.str() + " },");
+        }
+        line(2, "},");
     }
 
     void writeParts(std::size_t indent, const std::vector<FieldDescription>& fields,

@@ -113,6 +113,22 @@ void addRun(LuaTable& table, const EntryRun& run) {
     }
 }
 
+std::string_view nameOf(ListPart::Kind kind) {
+    switch (kind) {
+    case ListPart::Kind::Keys:
+        return "keys";
+    case ListPart::Kind::Elements:
+        return "elements";
+    case ListPart::Kind::FirstCell:
+        return "first cell";
+    case ListPart::Kind::EachCell:
+        return "each cell";
+    case ListPart::Kind::CellEntries:
+        break;
+    }
+    return "cell entries";
+}
+
 } // namespace
 
 std::string luaPosition(const Position& position) {
@@ -158,9 +174,31 @@ std::string luaField(const FieldDescription& field, const std::string& filter) {
     if (!field.counters.empty()) {
         table.raw("counters", luaCounters(field.counters));
     }
-    addShownAs(table, field.shownAs);
+    if (!field.listKey.empty()) {
+        table.text("list_key", field.listKey);
+    }
+    if (field.listBits != 0) {
+        table.integer("low_bits", field.listBits);
+    }
+    const bool isAsItComes = !field.listKey.empty() && field.shownAs.format == nullptr;
+    if (!isAsItComes) {
+        addShownAs(table, field.shownAs);
+    }
     if (field.condition) {
         table.raw("condition", luaCondition(*field.condition));
+    }
+    return table.str();
+}
+
+std::string luaListPart(const ListPart& part) {
+    LuaTable table;
+    table.text("part", nameOf(part.kind));
+    if (!part.technologies.empty()) {
+        LuaTable technologies;
+        for (const std::string_view technology : part.technologies) {
+            technologies.element(luaText(technology));
+        }
+        table.raw("technologies", technologies.str()).text("cell_type", part.cellType);
     }
     return table.str();
 }

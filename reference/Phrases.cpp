@@ -1,6 +1,7 @@
 #include "reference/Phrases.h"
 
 #include "platform/Format.h"
+#include "platform/TelephonyConstants.h"
 
 #include <algorithm>
 #include <array>
@@ -14,6 +15,8 @@ namespace {
 
 constexpr unsigned kByteBits = 8;
 constexpr std::int64_t kLargestByte = 255;
+/// What the constants of the radio access technologies begin with.
+constexpr std::string_view kRadioAccessTechnology = "kHXCellMonitorRadioAccessTechnology";
 
 /// The raw numbers that a field can show, both ends included.
 struct RawRange {
@@ -193,6 +196,21 @@ std::string countOf(const ListDescription& list) {
            (list.plus != 0 ? ", and " + std::to_string(list.plus) + " more" : "");
 }
 
+/// "the first serving cell of GSM or UMTS"
+std::string inWords(const ListPart& part) {
+    if (!part.words.empty()) {
+        return std::string(part.words);
+    }
+    std::string text(part.kind == ListPart::Kind::FirstCell ? "the first " : "each ");
+    text += part.cellType == kHXCellMonitorCellTypeServing ? "serving cell" : "neighbour";
+    std::string_view before = " of ";
+    for (const std::string_view technology : part.technologies) {
+        text.append(before).append(technology.substr(kRadioAccessTechnology.size()));
+        before = " or ";
+    }
+    return text + (part.kind == ListPart::Kind::EachCell ? ", so that the last one stays" : "");
+}
+
 } // namespace
 
 std::string printfText(const NumberFormat& format) {
@@ -299,9 +317,9 @@ std::string layoutOf(const ListDescription& list) {
 
 std::string demandsOf(const CodeDescription& code) {
     std::string text;
-    if (!code.listPart.empty()) {
+    if (code.listPart) {
         text = "A property list from byte " + std::to_string(LogRecord::kHeaderLength) +
-               " on: " + std::string(code.listPart) + ".";
+               " on: " + inWords(*code.listPart) + ".";
     } else {
         text = (code.exactLength ? "Exactly " : "At least ") + std::to_string(code.minimumLength) +
                " bytes.";

@@ -22,8 +22,7 @@ and a subpacket are counted from their own first byte. The columns:
 
 Bytes beyond the end of a record read as zero, and a list ends at the first entry that is not whole.
 
-The dissector in `extras/wireshark` shows all of this but what comes out of property lists: of these it
-shows the bytes and, in the XML form, the keys and values as they stand there.
+The dissector in `extras/wireshark` shows all of this.
 )";
 
 /// A text inside a table's cell or a sentence.

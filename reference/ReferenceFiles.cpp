@@ -13,7 +13,8 @@ namespace pallax {
 
 std::string dissectorProgram(const std::string& tree) {
     std::string program;
-    for (const char* name : {"numbers", "computations", "items", "records"}) {
+    for (const char* name : {"numbers", "computations", "items", "property_lists", "binary_lists",
+                             "xml_lists", "text_lists", "list_sections", "records"}) {
         const std::string path = tree + "/reference/dissector/" + name + ".lua";
         std::ifstream file(path, std::ios::binary);
         if (!file) {

@@ -6,12 +6,14 @@
 #include "platform/TelephonyConstants.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace pallax {
 
 namespace {
 
 constexpr std::int16_t kNotMeasured = 32767;
+constexpr unsigned kLevelBits = 16;
 
 bool holds(const Dictionary& cell, std::string_view key, std::string_view value) {
     const PropertyList* found = cell.find(key);
@@ -112,10 +114,10 @@ Array cellEntries(const Array& cells, std::string_view radioAccessTechnology,
     return entries;
 }
 
-CodeDescription describeCells(std::string_view part, std::span<const CellNumber> numbers,
+CodeDescription describeCells(ListPart part, std::span<const CellNumber> numbers,
                               std::span<const CellLevel> levels) {
     CodeDescription code{kCellMonitorLogCode};
-    code.listPart = part;
+    code.listPart = std::move(part);
     if (!levels.empty()) {
         code.note = "Of a level only the low 16 bits count, as a signed number.";
     }
@@ -131,6 +133,7 @@ CodeDescription describeCells(std::string_view part, std::span<const CellNumber>
         field.shownAs.factor = level.factor;
         field.shownAs.exceptional = kNotMeasured;
         field.listKey = level.cellKey;
+        field.listBits = kLevelBits;
         code.fields.push_back(std::move(field));
     }
     return code;

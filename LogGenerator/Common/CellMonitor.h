@@ -76,7 +76,7 @@ Array cellEntries(const Array& cells, std::string_view radioAccessTechnology,
                   std::span<const CellLevel> levels);
 
 /// What `showCellNumbers` and `showCellLevels` show of that part of the array.
-CodeDescription describeCells(std::string_view part, std::span<const CellNumber> numbers,
+CodeDescription describeCells(ListPart part, std::span<const CellNumber> numbers,
                               std::span<const CellLevel> levels);
 
 } // namespace pallax

@@ -27,8 +27,8 @@ void PDPContextList::updateWithData(const LogRecord& record, LogCode /*logCode*/
 
 RecordDescription PDPContextList::describe() const {
     CodeDescription code{kPDPContextsLogCode};
-    code.listPart = "the array of contexts, as the telephony service describes them";
-    code.listIsEntries = true;
+    code.listPart = {.kind = ListPart::Kind::Elements,
+                     .words = "the array of contexts, as the telephony service describes them"};
     return {std::move(code)};
 }
 

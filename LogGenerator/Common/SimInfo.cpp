@@ -54,7 +54,8 @@ void SimInfo::updateWithData(const LogRecord& record, LogCode logCode) {
 
 RecordDescription SimInfo::describe() const {
     CodeDescription code{kSimFilesLogCode};
-    code.listPart = "the dictionary of SIM files; values of any type, as they come";
+    code.listPart = {.kind = ListPart::Kind::Keys,
+                     .words = "the dictionary of SIM files; values of any type, as they come"};
     for (const SimFile& simFile : kSimFiles) {
         FieldDescription field{std::string(simFile.key)};
         field.listKey = simFile.propertyListKey;

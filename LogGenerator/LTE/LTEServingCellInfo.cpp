@@ -116,7 +116,10 @@ RecordDescription LTEServingCellInfo::describe() const {
     CodeDescription antennas{kAntennasLogCode, kAntennasRecordLength};
     antennas.fields = describeFields(kAntennasFields);
     return {std::move(identity), std::move(antennas),
-            describeCells("the first serving cell of LTE", kCellNumbers, {})};
+            describeCells(ListPart{ListPart::Kind::FirstCell,
+                                   {kHXCellMonitorRadioAccessTechnologyLTE},
+                                   kHXCellMonitorCellTypeServing},
+                          kCellNumbers, {})};
 }
 
 } // namespace pallax

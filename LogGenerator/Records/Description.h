@@ -58,6 +58,8 @@ struct FieldDescription {
     std::optional<Position> position = std::nullopt;
     ShownAs shownAs = {};
     std::string_view listKey = {}; ///< under which the property list holds the value
+    /// How many low bits of the property list's number count, as a signed one; 0: all.
+    unsigned listBits = 0;
     std::string_view formula = {}; ///< how a computed value is made of the bytes in `read`
     /// What the formula is called, for those who compute it elsewhere.
     std::string_view computation = {};
@@ -118,6 +120,26 @@ struct ListDescription {
     std::string_view rememberedAs = {};
 };
 
+/// Of which part of a property list the fields of a record are.
+struct ListPart {
+    enum class Kind {
+        Keys,        ///< the list itself, a dictionary; its values are shown as they come
+        Elements,    ///< each element of the list, an array, is an entry, as it comes
+        FirstCell,   ///< of an array of cells the first one that is looked for
+        EachCell,    ///< each of them; of a key that several have, the last value stays
+        CellEntries, ///< each of them is an entry of the section's list
+    };
+
+    Kind kind;
+    // Which cells are looked for: the telephony service's constants.
+    std::vector<std::string_view> technologies = {};
+    std::string_view cellType = {};
+    std::string_view words = {}; ///< what the list is, where it is none of cells
+
+    /// Whether the section is a list, and each such part an entry of it.
+    bool isEntries() const { return kind == Kind::Elements || kind == Kind::CellEntries; }
+};
+
 struct SubpacketDescription {
     std::uint8_t id;
     std::vector<FieldDescription> fields;
@@ -135,12 +157,8 @@ struct CodeDescription {
     std::vector<ListDescription> lists = {};
     std::vector<SubpacketDescription> subpackets = {};
 
-    /// Which part of a property list the fields are of ("the first serving cell of GSM"); empty for
-    /// a record without one.
-    std::string_view listPart = {};
-    /// Whether each such part is an entry of the section's list.
-    bool listIsEntries = false;
-    std::string_view note = {}; ///< what else the record does: whole sentences
+    std::optional<ListPart> listPart = std::nullopt; ///< of a record that is a property list
+    std::string_view note = {};                      ///< what else the record does: whole sentences
 };
 
 using RecordDescription = std::vector<CodeDescription>;

@@ -78,8 +78,10 @@ void UTRANServingCellInfo::showServingCell(const PropertyList& cell) {
 RecordDescription UTRANServingCellInfo::describe() const {
     CodeDescription cell{kServingCellLogCode, kServingCellLength};
     cell.fields = describeFields(kFields);
-    CodeDescription monitored =
-        describeCells("each serving cell of UTRAN, so that the last one stays", kCellNumbers, {});
+    CodeDescription monitored = describeCells(ListPart{ListPart::Kind::EachCell,
+                                                       {kHXCellMonitorRadioAccessTechnologyUTRAN2},
+                                                       kHXCellMonitorCellTypeServing},
+                                              kCellNumbers, {});
     for (const std::string_view key : {kUplinkKey, kDownlinkKey}) {
         FieldDescription field{std::string(key)};
         field.shownAs.format = &kDecimal;

@@ -73,7 +73,10 @@ void GSMServingCell::showServingCell(const LogRecord& record) {
 
 RecordDescription GSMServingCell::describe() const {
     RecordDescription description = describeGroups(kGroups);
-    description.push_back(describeCells("the first serving cell of GSM", kCellNumbers, {}));
+    description.push_back(describeCells(ListPart{ListPart::Kind::FirstCell,
+                                                 {kHXCellMonitorRadioAccessTechnologyGSM},
+                                                 kHXCellMonitorCellTypeServing},
+                                        kCellNumbers, {}));
     return description;
 }
 

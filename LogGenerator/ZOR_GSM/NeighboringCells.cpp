@@ -131,8 +131,10 @@ RecordDescription NeighboringCells::describe() const {
     bsics.lists.front().rememberedAs = "bsic";
     bsics.note = "Remembered for the lists to come; shows nothing itself.";
 
-    CodeDescription monitored = describeCells("each neighbour of GSM", kCellNumbers, kCellLevels);
-    monitored.listIsEntries = true;
+    CodeDescription monitored = describeCells(ListPart{ListPart::Kind::CellEntries,
+                                                       {kHXCellMonitorRadioAccessTechnologyGSM},
+                                                       kHXCellMonitorCellTypeNeighbor},
+                                              kCellNumbers, kCellLevels);
     return {std::move(measured), std::move(bsics), std::move(monitored)};
 }
 

@@ -149,7 +149,11 @@ RecordDescription ServingPLMN::describe() const {
     CodeDescription selection{kRegistrationLogCode, kStateRecordLength};
     selection.fields = describeFields(kSelectionFields);
     return {std::move(network), std::move(selection),
-            describeCells("the first serving cell of GSM or UMTS", kCellNumbers, {})};
+            describeCells(ListPart{ListPart::Kind::FirstCell,
+                                   {kHXCellMonitorRadioAccessTechnologyGSM,
+                                    kHXCellMonitorRadioAccessTechnologyUMTS},
+                                   kHXCellMonitorCellTypeServing},
+                          kCellNumbers, {})};
 }
 
 } // namespace pallax

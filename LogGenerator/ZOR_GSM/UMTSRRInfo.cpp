@@ -178,7 +178,10 @@ RecordDescription UMTSRRInfo::describe() const {
     CodeDescription ciphering{kCipheringLogCode, kCipheringRecordLength};
     ciphering.fields = describeFields(kCipheringFields);
     return {std::move(state), std::move(power), std::move(identity), std::move(ciphering),
-            describeCells("the first serving cell of UMTS", kCellNumbers, {})};
+            describeCells(ListPart{ListPart::Kind::FirstCell,
+                                   {kHXCellMonitorRadioAccessTechnologyUMTS},
+                                   kHXCellMonitorCellTypeServing},
+                          kCellNumbers, {})};
 }
 
 } // namespace pallax

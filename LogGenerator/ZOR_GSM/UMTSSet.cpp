@@ -90,8 +90,10 @@ RecordDescription UMTSSet::describe() const {
     CodeDescription ranking{kRankingLogCode, kRankingRecordLength};
     ranking.lists = {describeList("", {kRankingEntriesStart, kEntryLength, kEntryLength},
                                   u8At(kCountOffset), kEntryFields)};
-    CodeDescription monitored = describeCells("each neighbour of UMTS", kCellNumbers, kCellLevels);
-    monitored.listIsEntries = true;
+    CodeDescription monitored = describeCells(ListPart{ListPart::Kind::CellEntries,
+                                                       {kHXCellMonitorRadioAccessTechnologyUMTS},
+                                                       kHXCellMonitorCellTypeNeighbor},
+                                              kCellNumbers, kCellLevels);
     return {std::move(ranking), std::move(monitored)};
 }
 

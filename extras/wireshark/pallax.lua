@@ -14,6 +14,14 @@ local technologies = {
     framing = "object",
     codes = {
     },
+    objects = {
+      ["Network"] = { filter = "network", keys = { ["Name"] = "network.name", ["MCC"] = "network.mcc", ["MNC"] = "network.mnc" } },
+      ["RR"] = { filter = "rr", keys = {  } },
+      ["Serving Cell"] = { filter = "serving_cell", keys = { ["ARFCN"] = "serving_cell.arfcn", ["BSIC"] = "serving_cell.bsic", ["Rx Level"] = "serving_cell.rx_level", ["C1"] = "serving_cell.c1", ["Area"] = "serving_cell.area", ["LAC"] = "serving_cell.lac", ["Cell ID"] = "serving_cell.cell_id" } },
+      ["Neighbour Cells"] = { filter = "neighbour_cells", keys = { ["ARFCN"] = "neighbour_cells.arfcn", ["BSIC"] = "neighbour_cells.bsic", ["Rx Level"] = "neighbour_cells.rx_level" } },
+      ["Dedicated Channel"] = { filter = "dedicated_channel", keys = { ["Channel"] = "dedicated_channel.channel", ["Time Slot"] = "dedicated_channel.time_slot", ["Timing Advance"] = "dedicated_channel.timing_advance", ["Rx Quality"] = "dedicated_channel.rx_quality", ["Tx Power"] = "dedicated_channel.tx_power", ["Hopping"] = "dedicated_channel.hopping" } },
+      ["Barred Cells"] = { filter = "barred_cells", keys = {  } },
+    },
   },
   {
     name = "pallax_gsm", title = "GSM/UMTS", encapsulation = "USER1",
@@ -437,31 +445,78 @@ local technologies = {
       [0xFF0000] = {
         name = "SIM files",
         {
-          head = { section = "SIM Info", least = 0, property_list = true },
+          head = { section = "SIM Info", least = 0 },
+          list = { part = "keys" },
+          fields = {
+            { key = "EF-ICCID", filter = "sim_info.ef_iccid", list_key = "kSimFile_ICCID" },
+            { key = "EF-MSISDN", filter = "sim_info.ef_msisdn", list_key = "kSimFile_MSISDN" },
+            { key = "EF-3GPP MAIL BOX DIALING NUMBER", filter = "sim_info.ef_3gpp_mail_box_dialing_number", list_key = "kSimFile_MBDN" },
+            { key = "EF-HPPLMN SEARCH PERIOD", filter = "sim_info.ef_hpplmn_search_period", list_key = "kSimFile_HPPLMN" },
+            { key = "EF-LOCI", filter = "sim_info.ef_loci", list_key = "kSimFile_LOCI" },
+            { key = "EF-GPRS/PS-LOCI", filter = "sim_info.ef_gprs_ps_loci", list_key = "kSimFile_PSLOCI" },
+            { key = "EF-ACCESS CONTROL CLASS", filter = "sim_info.ef_access_control_class", list_key = "kSimFile_ACC" },
+            { key = "EF-ADMINISTRATIVE DATA", filter = "sim_info.ef_administrative_data", list_key = "kSimFile_AD" },
+            { key = "EF-FPLMN", filter = "sim_info.ef_fplmn", list_key = "kSimFile_FPLMN" },
+            { key = "EF-ACTING HPLMN", filter = "sim_info.ef_acting_hplmn", list_key = "kSimFile_AHPLMN" },
+            { key = "EF-RAT MODE", filter = "sim_info.ef_rat_mode", list_key = "kSimFile_RATMODE" },
+            { key = "EF-PLMN NETWORK NAME", filter = "sim_info.ef_plmn_network_name", list_key = "kSimFile_PNN" },
+            { key = "EF-OPERATOR PLMN LIST", filter = "sim_info.ef_operator_plmn_list", list_key = "kSimFile_OPL" },
+            { key = "EF-OPLMNAcT", filter = "sim_info.ef_oplmnact", list_key = "kSimFile_OPLMNAcT" },
+          },
         },
       },
       [0xFF0001] = {
         name = "Cell monitor",
         {
-          head = { section = "Serving PLMN", least = 0, property_list = true },
+          head = { section = "Serving PLMN", least = 0 },
+          list = { part = "first cell", technologies = { "kHXCellMonitorRadioAccessTechnologyGSM", "kHXCellMonitorRadioAccessTechnologyUMTS" }, cell_type = "kHXCellMonitorCellTypeServing" },
+          fields = {
+            { key = "Mobile Country Code", filter = "serving_plmn.mobile_country_code", list_key = "kHXCellMonitorMCC", format = { number = "%d" } },
+            { key = "Mobile Network Code", filter = "serving_plmn.mobile_network_code", list_key = "kHXCellMonitorMNC", format = { number = "%d" } },
+            { key = "Location Area Code", filter = "serving_plmn.location_area_code", list_key = "kHXCellMonitorLAC", format = { number = "%d" } },
+          },
         },
         {
-          head = { section = "GSM Serving Cell", least = 0, property_list = true },
+          head = { section = "GSM Serving Cell", least = 0 },
+          list = { part = "first cell", technologies = { "kHXCellMonitorRadioAccessTechnologyGSM" }, cell_type = "kHXCellMonitorCellTypeServing" },
+          fields = {
+            { key = "Cell ID", filter = "gsm_serving_cell.cell_id", list_key = "kHXCellMonitorCellId", format = { number = "%d" } },
+            { key = "ARFCN", filter = "gsm_serving_cell.arfcn", list_key = "kHXCellMonitorARFCN", format = { number = "%d" } },
+          },
         },
         {
-          head = { section = "Neighboring Cells", least = 0, property_list = true },
+          head = { section = "Neighboring Cells", least = 0 },
+          list = { part = "cell entries", technologies = { "kHXCellMonitorRadioAccessTechnologyGSM" }, cell_type = "kHXCellMonitorCellTypeNeighbor" },
+          fields = {
+            { key = "ARFCN", filter = "neighboring_cells.arfcn", list_key = "kHXCellMonitorARFCN", format = { number = "%d" } },
+            { key = "RSSI", filter = "neighboring_cells.rssi", list_key = "kHXCellMonitorRSSI", low_bits = 16, format = { number = "%d", behind = " dBm" }, factor = 2, except = 32767, except_text = "" },
+          },
         },
         {
-          head = { section = "UMTS RR Info", least = 0, property_list = true },
+          head = { section = "UMTS RR Info", least = 0 },
+          list = { part = "first cell", technologies = { "kHXCellMonitorRadioAccessTechnologyUMTS" }, cell_type = "kHXCellMonitorCellTypeServing" },
+          fields = {
+            { key = "Cell ID", filter = "umts_rr_info.cell_id", list_key = "kHXCellMonitorCellId", format = { number = "%d" } },
+            { key = "UARFCN", filter = "umts_rr_info.uarfcn", list_key = "kHXCellMonitorUARFCN", format = { number = "%d" } },
+            { key = "Scrambling Code", filter = "umts_rr_info.scrambling_code", list_key = "kHXCellMonitorSCN", format = { number = "%d" } },
+          },
         },
         {
-          head = { section = "UMTS Set", least = 0, property_list = true },
+          head = { section = "UMTS Set", least = 0 },
+          list = { part = "cell entries", technologies = { "kHXCellMonitorRadioAccessTechnologyUMTS" }, cell_type = "kHXCellMonitorCellTypeNeighbor" },
+          fields = {
+            { key = "UARFCN", filter = "umts_set.uarfcn", list_key = "kHXCellMonitorUARFCN", format = { number = "%d" } },
+            { key = "Scrambling Code", filter = "umts_set.scrambling_code", list_key = "kHXCellMonitorSCN", format = { number = "%d" } },
+            { key = "RSCP", filter = "umts_set.rscp", list_key = "kHXCellMonitorRSCP", low_bits = 16, format = { number = "%d", behind = " dBm" }, except = 32767, except_text = "" },
+            { key = "Energy Per Chip", filter = "umts_set.energy_per_chip", list_key = "kHXCellMonitorECN0", low_bits = 16, format = { number = "%d", behind = " dB" }, except = 32767, except_text = "" },
+          },
         },
       },
       [0xFF0002] = {
         name = "Contexts of packet data",
         {
-          head = { section = "PDP Context Info", least = 0, property_list = true },
+          head = { section = "PDP Context Info", least = 0 },
+          list = { part = "elements" },
         },
       },
     },
@@ -807,19 +862,45 @@ local technologies = {
       [0xFF0000] = {
         name = "SIM files",
         {
-          head = { section = "SIM Info", least = 0, property_list = true },
+          head = { section = "SIM Info", least = 0 },
+          list = { part = "keys" },
+          fields = {
+            { key = "EF-ICCID", filter = "sim_info.ef_iccid", list_key = "kSimFile_ICCID" },
+            { key = "EF-MSISDN", filter = "sim_info.ef_msisdn", list_key = "kSimFile_MSISDN" },
+            { key = "EF-3GPP MAIL BOX DIALING NUMBER", filter = "sim_info.ef_3gpp_mail_box_dialing_number", list_key = "kSimFile_MBDN" },
+            { key = "EF-HPPLMN SEARCH PERIOD", filter = "sim_info.ef_hpplmn_search_period", list_key = "kSimFile_HPPLMN" },
+            { key = "EF-LOCI", filter = "sim_info.ef_loci", list_key = "kSimFile_LOCI" },
+            { key = "EF-GPRS/PS-LOCI", filter = "sim_info.ef_gprs_ps_loci", list_key = "kSimFile_PSLOCI" },
+            { key = "EF-ACCESS CONTROL CLASS", filter = "sim_info.ef_access_control_class", list_key = "kSimFile_ACC" },
+            { key = "EF-ADMINISTRATIVE DATA", filter = "sim_info.ef_administrative_data", list_key = "kSimFile_AD" },
+            { key = "EF-FPLMN", filter = "sim_info.ef_fplmn", list_key = "kSimFile_FPLMN" },
+            { key = "EF-ACTING HPLMN", filter = "sim_info.ef_acting_hplmn", list_key = "kSimFile_AHPLMN" },
+            { key = "EF-RAT MODE", filter = "sim_info.ef_rat_mode", list_key = "kSimFile_RATMODE" },
+            { key = "EF-PLMN NETWORK NAME", filter = "sim_info.ef_plmn_network_name", list_key = "kSimFile_PNN" },
+            { key = "EF-OPERATOR PLMN LIST", filter = "sim_info.ef_operator_plmn_list", list_key = "kSimFile_OPL" },
+            { key = "EF-OPLMNAcT", filter = "sim_info.ef_oplmnact", list_key = "kSimFile_OPLMNAcT" },
+          },
         },
       },
       [0xFF0001] = {
         name = "Cell monitor",
         {
-          head = { section = "Serving Cell Info", least = 0, property_list = true },
+          head = { section = "Serving Cell Info", least = 0 },
+          list = { part = "first cell", technologies = { "kHXCellMonitorRadioAccessTechnologyLTE" }, cell_type = "kHXCellMonitorCellTypeServing" },
+          fields = {
+            { key = "Tracking Area Code", filter = "serving_cell_info.tracking_area_code", list_key = "kHXCellMonitorTAC", format = { number = "%d" } },
+            { key = "Cell Identity", filter = "serving_cell_info.cell_identity", list_key = "kHXCellMonitorCellId", format = { number = "%d" } },
+            { key = "Physical Cell ID", filter = "serving_cell_info.physical_cell_id", list_key = "kHXCellMonitorPID", format = { number = "%d" } },
+            { key = "Freq Band Indicator", filter = "serving_cell_info.freq_band_indicator", list_key = "kHXCellMonitorBandInfo", format = { number = "%d" } },
+            { key = "UARFCN", filter = "serving_cell_info.uarfcn", list_key = "kHXCellMonitorUARFCN", format = { number = "%d" } },
+          },
         },
       },
       [0xFF0002] = {
         name = "Contexts of packet data",
         {
-          head = { section = "PDP Context Info", least = 0, property_list = true },
+          head = { section = "PDP Context Info", least = 0 },
+          list = { part = "elements" },
         },
       },
     },
@@ -927,19 +1008,46 @@ local technologies = {
       [0xFF0000] = {
         name = "SIM files",
         {
-          head = { section = "SIM Info", least = 0, property_list = true },
+          head = { section = "SIM Info", least = 0 },
+          list = { part = "keys" },
+          fields = {
+            { key = "EF-ICCID", filter = "sim_info.ef_iccid", list_key = "kSimFile_ICCID" },
+            { key = "EF-MSISDN", filter = "sim_info.ef_msisdn", list_key = "kSimFile_MSISDN" },
+            { key = "EF-3GPP MAIL BOX DIALING NUMBER", filter = "sim_info.ef_3gpp_mail_box_dialing_number", list_key = "kSimFile_MBDN" },
+            { key = "EF-HPPLMN SEARCH PERIOD", filter = "sim_info.ef_hpplmn_search_period", list_key = "kSimFile_HPPLMN" },
+            { key = "EF-LOCI", filter = "sim_info.ef_loci", list_key = "kSimFile_LOCI" },
+            { key = "EF-GPRS/PS-LOCI", filter = "sim_info.ef_gprs_ps_loci", list_key = "kSimFile_PSLOCI" },
+            { key = "EF-ACCESS CONTROL CLASS", filter = "sim_info.ef_access_control_class", list_key = "kSimFile_ACC" },
+            { key = "EF-ADMINISTRATIVE DATA", filter = "sim_info.ef_administrative_data", list_key = "kSimFile_AD" },
+            { key = "EF-FPLMN", filter = "sim_info.ef_fplmn", list_key = "kSimFile_FPLMN" },
+            { key = "EF-ACTING HPLMN", filter = "sim_info.ef_acting_hplmn", list_key = "kSimFile_AHPLMN" },
+            { key = "EF-RAT MODE", filter = "sim_info.ef_rat_mode", list_key = "kSimFile_RATMODE" },
+            { key = "EF-PLMN NETWORK NAME", filter = "sim_info.ef_plmn_network_name", list_key = "kSimFile_PNN" },
+            { key = "EF-OPERATOR PLMN LIST", filter = "sim_info.ef_operator_plmn_list", list_key = "kSimFile_OPL" },
+            { key = "EF-OPLMNAcT", filter = "sim_info.ef_oplmnact", list_key = "kSimFile_OPLMNAcT" },
+          },
         },
       },
       [0xFF0001] = {
         name = "Cell monitor",
         {
-          head = { section = "Serving Cell Info", least = 0, property_list = true },
+          head = { section = "Serving Cell Info", least = 0 },
+          list = { part = "each cell", technologies = { "kHXCellMonitorRadioAccessTechnologyUTRAN2" }, cell_type = "kHXCellMonitorCellTypeServing" },
+          fields = {
+            { key = "Local Area Code", filter = "serving_cell_info.local_area_code", list_key = "kHXCellMonitorLAC", format = { number = "%d" } },
+            { key = "Cell ID", filter = "serving_cell_info.cell_id", list_key = "kHXCellMonitorCellId", format = { number = "%d" } },
+            { key = "Freq Band Indicator", filter = "serving_cell_info.freq_band_indicator", list_key = "kHXCellMonitorBandInfo", format = { number = "%d" } },
+            { key = "Cell Scrambling Code", filter = "serving_cell_info.cell_scrambling_code", list_key = "kHXCellMonitorSCN", format = { number = "%d" } },
+            { key = "Uplink UARFCN", filter = "serving_cell_info.uplink_uarfcn", list_key = "kHXCellMonitorUARFCN", format = { number = "%d" } },
+            { key = "Downlink UARFCN", filter = "serving_cell_info.downlink_uarfcn", list_key = "kHXCellMonitorUARFCN", format = { number = "%d" } },
+          },
         },
       },
       [0xFF0002] = {
         name = "Contexts of packet data",
         {
-          head = { section = "PDP Context Info", least = 0, property_list = true },
+          head = { section = "PDP Context Info", least = 0 },
+          list = { part = "elements" },
         },
       },
     },
@@ -992,7 +1100,6 @@ local EXTENDED_CODES = 0xFF0000
 local PREFIX, PREFIX_LENGTH = 0x81, 2
 local SUBPACKET_COUNT, FIRST_SUBPACKET = 14, 17
 local TRAFFIC = 8 -- the 1x device state
-local MOST_PROPERTIES = 1000
 
 -- Numbers
 
@@ -1223,16 +1330,21 @@ end
 
 -- Items
 
-local function add_item(context, tree, field, range, text, value)
-  local label = field.key ~= "" and field.key .. ": " .. text or text
-  local known = context.technology.fields[field.filter]
-  if known.is_number and value and value == value then
+-- An item with its label; under `filter` also with what it can be filtered by, where that is known.
+local function add_labelled(context, tree, filter, range, text, value, label)
+  local known = filter and context.technology.fields[filter]
+  if known and known.is_number and value and value == value then
     tree:add(known.field, range, value, label)
-  elseif not known.is_number then
+  elseif known and not known.is_number then
     tree:add(known.field, range, text, label)
   else
-    tree:add(range, label) -- a text where others of the key are numbers
+    tree:add(range, label) -- also a text where others of the key are numbers
   end
+end
+
+local function add_item(context, tree, field, range, text, value)
+  local label = field.key ~= "" and field.key .. ": " .. text or text
+  add_labelled(context, tree, field.filter, range, text, value, label)
 end
 
 local function number_of(context, condition)
@@ -1420,6 +1532,914 @@ function add_parts(context, tree, part)
   for _, list in ipairs(part.lists or {}) do add_list(context, tree, list) end
 end
 
+-- Property lists: the bytes of a serialized object as a tree of nodes.
+--
+-- A node tells its kind ("string", "integer", "real", "boolean", "data", "date", "array" or
+-- "dictionary") and where its bytes lie; a scalar its text, a number also what it is worth. What
+-- Pallax takes for no property list is none here either. Beyond that a list may be nested less deep
+-- and hold less, and XML that nobody writes is not read.
+
+local DEEPEST_LIST, MOST_VALUES = 64, 20000
+local MOST_EXPANDED = 65536 -- bytes of texts, beyond those of the list
+local SECONDS_OF_DAY = 86400
+local REFUSAL = "no property list that can be read"
+
+local function refuse()
+  error(REFUSAL, 0)
+end
+
+local function count_value(source, depth)
+  source.values = source.values + 1
+  if source.values > MOST_VALUES or depth > DEEPEST_LIST then refuse() end
+end
+
+-- Goes on behind the pattern where it stands next, and gives its captures, or true.
+local function take(source, pattern)
+  local first, last, found, other = source.bytes:find("^" .. pattern, source.next)
+  if first then source.next = last + 1 end
+  return found or first and true, other
+end
+
+local function new_dictionary()
+  return { kind = "dictionary", entries = {}, places = {} }
+end
+
+-- A key that stands twice keeps its first place and takes its last value.
+local function set_entry(dictionary, key, value)
+  local known = dictionary.places[key]
+  if known then
+    known.value = value
+  else
+    local entry = { key = key, value = value }
+    dictionary.entries[#dictionary.entries + 1] = entry
+    dictionary.places[key] = entry
+  end
+end
+
+-- The node under a key; nothing where there is none, or no dictionary.
+local function find(node, key)
+  local entry = node.kind == "dictionary" and node.places[key]
+  return entry and entry.value or nil
+end
+
+-- The number of a node that is a signed one of 32 bits.
+local function int32_of(node)
+  local number = node.number
+  local is_whole = number and number == math.floor(number)
+  return is_whole and number >= -2 ^ 31 and number < 2 ^ 31 and number or nil
+end
+
+-- UTF-8
+
+local UTF8_SHAPES = {
+  "^[\194-\223][\128-\191]()",
+  "^\224[\160-\191][\128-\191]()",
+  "^[\225-\236\238\239][\128-\191][\128-\191]()",
+  "^\237[\128-\159][\128-\191]()",
+  "^\240[\144-\191][\128-\191][\128-\191]()",
+  "^[\241-\243][\128-\191][\128-\191][\128-\191]()",
+  "^\244[\128-\143][\128-\191][\128-\191]()",
+}
+
+local function past_character(text, at)
+  for _, shape in ipairs(UTF8_SHAPES) do
+    local past = text:match(shape, at)
+    if past then return past end
+  end
+  return nil
+end
+
+local function is_utf8(text)
+  local at = text:find("[\128-\255]")
+  while at do
+    local past = past_character(text, at)
+    if not past then return false end
+    at = text:find("[\128-\255]", past)
+  end
+  return true
+end
+
+local function utf8_of(code)
+  local function follower(place)
+    return 0x80 + math.floor(code / 64 ^ place) % 64
+  end
+  if code < 0x80 then return string.char(code) end
+  if code < 0x800 then return string.char(0xC0 + math.floor(code / 64), follower(0)) end
+  if code < 0x10000 then
+    return string.char(0xE0 + math.floor(code / 64 ^ 2), follower(1), follower(0))
+  end
+  return string.char(0xF0 + math.floor(code / 64 ^ 3), follower(2), follower(1), follower(0))
+end
+
+-- Texts of scalars, as `pallax decode` writes them
+
+-- The shortest text that reads back the same, without an exponent where that is no longer.
+local function real_text(number)
+  if number ~= number or math.abs(number) == math.huge then return "null" end
+  local text
+  for precision = 0, 16 do
+    text = string.format("%." .. precision .. "e", number)
+    if tonumber(text) == number then break end
+  end
+  local sign, digits, power = text:match("^(%-?)([%d.]+)e([+-]%d+)$")
+  digits, power = digits:gsub("%.", ""), tonumber(power)
+  local plain
+  if power >= #digits - 1 then
+    plain = digits .. string.rep("0", power + 1 - #digits)
+  elseif power >= 0 then
+    plain = digits:sub(1, power + 1) .. "." .. digits:sub(power + 2)
+  else
+    plain = "0." .. string.rep("0", -power - 1) .. digits
+  end
+  if #sign + #plain > #text then return text end
+  return math.abs(number) >= 2 ^ 53 and string.format("%.0f", number) or sign .. plain
+end
+
+local BASE64 = "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/"
+
+local function base64_text(bytes)
+  local letters = {}
+  for at = 1, #bytes, 3 do
+    local first, second, third = bytes:byte(at, at + 2)
+    local group = first * 65536 + (second or 0) * 256 + (third or 0)
+    for place = 3, 0, -1 do
+      local digit = math.floor(group / 64 ^ place) % 64 + 1
+      letters[#letters + 1] = BASE64:sub(digit, digit)
+    end
+    if not third then letters[#letters] = "=" end
+    if not second then letters[#letters - 1] = "=" end
+  end
+  return table.concat(letters)
+end
+
+-- The same of a base64 text that may hold white space; nothing where it is none.
+local function checked_base64(text)
+  text = text:gsub("[ \t\r\n]", "")
+  local digits, padding = text:match("^([A-Za-z0-9+/]*)(=?=?)$")
+  if not digits or #text % 4 ~= 0 then return nil end
+  local last = BASE64:find(digits:sub(-1), 1, true)
+  local unused = padding == "=" and 4 or padding == "==" and 16 or 1
+  return (digits == "" or (last - 1) % unused == 0) and text or nil
+end
+
+local function is_leap(year)
+  return year % 4 == 0 and year % 100 ~= 0 or year % 400 == 0
+end
+
+-- "2023-11-14T22:13:20Z" where it is a date, else nothing.
+local function checked_date(text)
+  local year, month, day, hour, minute, second =
+    text:match("^(%d%d%d%d)%-(%d%d)%-(%d%d)T(%d%d):(%d%d):(%d%d)Z$")
+  if not year then return nil end
+  local lengths = { 31, is_leap(tonumber(year)) and 29 or 28, 31, 30, 31, 30, 31, 31, 30, 31, 30, 31 }
+  local length = lengths[tonumber(month)]
+  local is_date = length and tonumber(day) >= 1 and tonumber(day) <= length
+  return is_date and tonumber(hour) < 24 and tonumber(minute) < 60 and tonumber(second) < 60
+    and text or nil
+end
+
+-- The same of seconds since 2001; nothing outside the years 0 to 9999. Years begin with March, so
+-- that the leap day is the last.
+local function date_text(seconds)
+  if not (math.abs(seconds) < 1e12) then return nil end
+  seconds = math.floor(seconds)
+  local days = math.floor(seconds / SECONDS_OF_DAY)
+  local rest = seconds - days * SECONDS_OF_DAY
+  days = days + 730791 -- since the first of March of the year 0
+  local era = math.floor(days / 146097)
+  days = days - era * 146097
+  local year = math.floor((days - math.floor(days / 1460) + math.floor(days / 36524)
+    - math.floor(days / 146096)) / 365)
+  days = days - 365 * year - math.floor(year / 4) + math.floor(year / 100)
+  local month = math.floor((5 * days + 2) / 153)
+  local day = days - math.floor((153 * month + 2) / 5) + 1
+  year = year + 400 * era + (month >= 10 and 1 or 0)
+  month = month + (month >= 10 and -9 or 3)
+  if year < 0 or year > 9999 then return nil end
+  return string.format("%04.0f-%02.0f-%02.0fT%02.0f:%02.0f:%02.0fZ", year, month, day,
+    math.floor(rest / 3600), math.floor(rest / 60) % 60, rest % 60)
+end
+
+-- The binary form: "bplist00", the objects, a table of their offsets, and a trailer. Offsets count
+-- from 0; numbers have their high byte first.
+
+local HEADER, TRAILER = "bplist00", 32
+local INTEGER, DATA, ASCII, UTF16, UTF8, ARRAY, DICTIONARY = 1, 4, 5, 6, 7, 10, 13
+
+local function big_endian(source, at, width, limit)
+  if at + width > limit then refuse() end
+  local number = 0.0
+  for index = at + 1, at + width do number = number * 256 + source.bytes:byte(index) end
+  return number
+end
+
+-- Reads the trailer.
+local function open_binary(source)
+  local size = #source.bytes
+  local trailer = size - TRAILER
+  if source.bytes:sub(1, #HEADER) ~= HEADER or trailer < #HEADER then refuse() end
+  source.offset_width = big_endian(source, trailer + 6, 1, size)
+  source.width = big_endian(source, trailer + 7, 1, size)
+  source.count = big_endian(source, trailer + 8, 8, size)
+  source.root = big_endian(source, trailer + 16, 8, size)
+  source.objects_end = big_endian(source, trailer + 24, 8, size)
+  local is_sound = source.offset_width >= 1 and source.offset_width <= 8
+    and source.width >= 1 and source.width <= 8
+    and source.objects_end > #HEADER and source.objects_end <= trailer
+    and source.count * source.offset_width == trailer - source.objects_end
+    and source.root < source.count
+  if not is_sound then refuse() end
+  source.scalars = {}
+  source.payload = size + MOST_EXPANDED
+end
+
+local function offset_of(source, reference)
+  if reference >= source.count then refuse() end
+  local at = source.objects_end + reference * source.offset_width
+  local offset = big_endian(source, at, source.offset_width, #source.bytes)
+  if offset < #HEADER or offset >= source.objects_end then refuse() end
+  return offset
+end
+
+local function marker_at(source, offset)
+  local byte = source.bytes:byte(offset + 1)
+  local marker = { kind = math.floor(byte / 16), low = byte % 16, content = offset + 1 }
+  local kind = marker.kind
+  marker.count = marker.low
+  local is_counted = kind >= DATA and kind <= UTF8 or kind == ARRAY or kind == DICTIONARY
+  if is_counted and marker.low == 15 then
+    local size = big_endian(source, marker.content, 1, source.objects_end) - 16 * INTEGER
+    if size < 0 or size > 3 then refuse() end
+    marker.count = big_endian(source, marker.content + 1, 2 ^ size, source.objects_end)
+    marker.content = marker.content + 1 + 2 ^ size
+  end
+  return marker
+end
+
+-- The content of an object, of so many bytes for each of its units.
+local function content_of(source, marker, unit)
+  marker.past = marker.content + marker.count * unit
+  if marker.past > source.objects_end then refuse() end
+  return source.bytes:sub(marker.content + 1, marker.past)
+end
+
+-- Texts and data may overlap: what they expand to stays in proportion to the bytes.
+local function spend(source, size)
+  source.payload = source.payload - size
+  if source.payload < 0 then refuse() end
+end
+
+local function text_of_utf16(units)
+  local letters, at = {}, 1
+  while at < #units do
+    local code = units:byte(at) * 256 + units:byte(at + 1)
+    at = at + 2
+    if code >= 0xD800 and code <= 0xDFFF then
+      local low = at < #units and units:byte(at) * 256 + units:byte(at + 1) or 0
+      if code >= 0xDC00 or low < 0xDC00 or low > 0xDFFF then refuse() end
+      code = 0x10000 + (code - 0xD800) * 1024 + low - 0xDC00
+      at = at + 2
+    end
+    letters[#letters + 1] = utf8_of(code)
+  end
+  return table.concat(letters)
+end
+
+local function binary_text(source, marker)
+  local bytes = content_of(source, marker, marker.kind == UTF16 and 2 or 1)
+  spend(source, #bytes)
+  if marker.kind == UTF16 then return text_of_utf16(bytes) end
+  if marker.kind == ASCII and bytes:find("[\128-\255]") or not is_utf8(bytes) then refuse() end
+  return bytes
+end
+
+-- Of 1, 2 or 4 bytes unsigned, of 8 signed; of 16 where 8 would have done.
+local function binary_integer(source, marker)
+  if marker.low > 4 then refuse() end
+  local at, width = marker.content, 2 ^ marker.low
+  marker.past = at + width
+  if width == 16 then
+    local high = source.bytes:sub(at + 1, at + 8)
+    width, at = 8, at + 8
+    local sign = big_endian(source, at, 1, source.objects_end) >= 128 and "\255" or "\0"
+    if high ~= string.rep(sign, 8) then refuse() end
+  end
+  if width < 8 then
+    local number = big_endian(source, at, width, source.objects_end)
+    return number, string.format("%.0f", number)
+  end
+  -- In halves, and the text in another way: a number of Lua may not hold all of the bits.
+  local low = big_endian(source, at + 4, 4, source.objects_end)
+  local high = signed(big_endian(source, at, 4, source.objects_end), 32)
+  return high * 2 ^ 32 + low, tostring(source.range:range(at, 8):int64())
+end
+
+local function binary_real(source, marker)
+  if marker.low ~= 2 and marker.low ~= 3 then refuse() end
+  marker.past = marker.content + 2 ^ marker.low
+  if marker.past > source.objects_end then refuse() end
+  return source.range:range(marker.content, 2 ^ marker.low):float()
+end
+
+local scalars = {}
+
+scalars[0] = function(_, marker)
+  if marker.low ~= 8 and marker.low ~= 9 then refuse() end
+  marker.past = marker.content
+  return { kind = "boolean", text = marker.low == 9 and "true" or "false" }
+end
+
+scalars[INTEGER] = function(source, marker)
+  local number, text = binary_integer(source, marker)
+  return { kind = "integer", number = number, text = text }
+end
+
+scalars[2] = function(source, marker)
+  local number = binary_real(source, marker)
+  return { kind = "real", number = number, text = real_text(number) }
+end
+
+scalars[3] = function(source, marker)
+  local text = marker.low == 3 and date_text(binary_real(source, marker))
+  return { kind = "date", text = text or refuse() }
+end
+
+scalars[DATA] = function(source, marker)
+  local bytes = content_of(source, marker, 1)
+  spend(source, #bytes)
+  return { kind = "data", text = base64_text(bytes) }
+end
+
+scalars[ASCII] = function(source, marker)
+  return { kind = "string", text = binary_text(source, marker) }
+end
+scalars[UTF16], scalars[UTF8] = scalars[ASCII], scalars[ASCII]
+
+local function binary_scalar(source, offset, marker)
+  local known = source.scalars[offset]
+  if known then return known end
+  local read = scalars[marker.kind] or refuse()
+  local node = read(source, marker)
+  node.at, node.length = offset, marker.past - offset
+  source.scalars[offset] = node
+  return node
+end
+
+-- References in a circle end with the greatest depth.
+local function binary_value(source, offset, depth)
+  count_value(source, depth)
+  local marker = marker_at(source, offset)
+  local is_dictionary = marker.kind == DICTIONARY
+  if not is_dictionary and marker.kind ~= ARRAY then
+    return binary_scalar(source, offset, marker)
+  end
+  content_of(source, marker, (is_dictionary and 2 or 1) * source.width)
+  local function reference(index)
+    local at = marker.content + index * source.width
+    return offset_of(source, big_endian(source, at, source.width, source.objects_end))
+  end
+  local node = is_dictionary and new_dictionary() or { kind = "array", elements = {} }
+  for index = 0, marker.count - 1 do
+    if is_dictionary then
+      local value = binary_value(source, reference(marker.count + index), depth + 1)
+      local key_offset = reference(index)
+      local key = binary_scalar(source, key_offset, marker_at(source, key_offset))
+      if key.kind == "string" then
+        set_entry(node, key.text, value)
+      else
+        node.entries[#node.entries + 1] = { value = value } -- counts, but is never displayed
+      end
+    else
+      node.elements[index + 1] = binary_value(source, reference(index), depth + 1)
+    end
+  end
+  node.at, node.length = offset, marker.past - offset
+  return node
+end
+
+local function read_binary(source)
+  open_binary(source)
+  return binary_value(source, offset_of(source, source.root), 1)
+end
+
+-- The XML form as programs write it: a declaration, a document type, comments between elements, and
+-- references are read; attributes (but for the list's version), sections and comments inside texts
+-- are not.
+
+local ENTITIES = { lt = "<", gt = ">", amp = "&", quot = '"', apos = "'" }
+
+-- White space and comments.
+local function skip_xml_space(source)
+  take(source, "%s*")
+  while take(source, "<!%-%-") do
+    local _, last = source.bytes:find("-->", source.next, true)
+    source.next = (last or refuse()) + 1
+    take(source, "%s*")
+  end
+end
+
+local function character(digits)
+  local code = digits:match("^x%x+$") and tonumber(digits:sub(2), 16)
+    or digits:match("^%d+$") and tonumber(digits, 10)
+  local is_character = code and code <= 0x10FFFF and (code < 0xD800 or code > 0xDFFF)
+    and (code >= 0x20 or code == 9 or code == 10 or code == 13)
+  return is_character and utf8_of(code) or refuse()
+end
+
+-- A text without its references.
+local function plain_text(text)
+  text = text:gsub("\r\n?", "\n")
+  local rest = text:gsub("&#?%w+;", "")
+  if rest:find("&", 1, true) then refuse() end
+  text = text:gsub("&(#?)(%w+);", function(number, name)
+    return number == "#" and character(name) or ENTITIES[name] or refuse()
+  end)
+  return text
+end
+
+-- The text up to the end tag of an element, and where it lies.
+local function text_of_element(source, name)
+  local at = source.next
+  local text = take(source, "([^<]*)")
+  local past = source.next
+  if not take(source, "</" .. name .. "%s*>") then refuse() end
+  return plain_text(text), at, past
+end
+
+local function trimmed(text)
+  return text:match("^[ \t\r\n]*(.-)[ \t\r\n]*$")
+end
+
+-- The number and its text, of digits that may be of any count.
+local function integer_of(text)
+  local sign, digits = trimmed(text):match("^([+-]?)(%d+)$")
+  if not sign then
+    sign, digits = trimmed(text):match("^([+-]?)0[xX](%x+)$")
+    if not sign or #digits:gsub("^0+", "") > 13 then refuse() end
+    digits = string.format("%.0f", tonumber(digits, 16))
+  end
+  digits = digits:gsub("^0+(%d)", "%1")
+  sign = sign == "-" and digits ~= "0" and "-" or ""
+  local largest = sign == "-" and "9223372036854775808" or "9223372036854775807"
+  if #digits > #largest or #digits == #largest and digits > largest then refuse() end
+  return tonumber(sign .. digits), sign .. digits
+end
+
+local function real_of(text)
+  local sign, digits = trimmed(text):match("^([+-]?)(.*)$")
+  local lower, number = digits:lower(), nil
+  if lower == "nan" then
+    number = 0 / 0
+  elseif lower == "inf" or lower == "infinity" then
+    number = math.huge
+  else
+    local significand = digits:match("^([%d.]+)$") or digits:match("^([%d.]+)[eE][+-]?%d+$")
+    local is_real = significand and significand:find("^%d*%.?%d*$") and significand:find("%d")
+    number = (is_real and tonumber(digits) or refuse()) + 0.0 -- a real also where Lua has integers
+    local is_in_range = number > 0 and number < math.huge
+    if not is_in_range and significand:find("[1-9]") then refuse() end
+  end
+  return sign == "-" and -number or number
+end
+
+local xml_scalars = {}
+
+xml_scalars.string = function(text) return text end
+xml_scalars.integer = function(text)
+  local number, digits = integer_of(text)
+  return digits, number
+end
+xml_scalars.real = function(text)
+  local number = real_of(text)
+  return real_text(number), number
+end
+xml_scalars.data = function(text) return checked_base64(text) end
+xml_scalars.date = function(text) return checked_date(trimmed(text)) end
+
+local function xml_scalar(source, name, first, is_empty)
+  local text, at, past = "", first, first
+  if not is_empty then text, at, past = text_of_element(source, name) end
+  local node = { kind = name }
+  if name == "true" or name == "false" then
+    if trimmed(text) ~= "" then refuse() end
+    node.kind, node.text = "boolean", name
+  else
+    local read = xml_scalars[name] or refuse()
+    node.text, node.number = read(text)
+    if not node.text then refuse() end
+  end
+  if at == past then at, past = first, source.next end -- of nothing inside, the element
+  node.at, node.length = at - 1, past - at
+  return node
+end
+
+local xml_value -- defined below: a container holds values
+
+local function fill_container(source, node, depth)
+  skip_xml_space(source)
+  while not take(source, "</" .. (node.elements and "array" or "dict") .. "%s*>") do
+    if node.elements then
+      node.elements[#node.elements + 1] = xml_value(source, depth + 1)
+    else
+      local is_empty = take(source, "<key%s*/>")
+      if not is_empty and not take(source, "<key%s*>") then refuse() end
+      local key = is_empty and "" or text_of_element(source, "key")
+      skip_xml_space(source)
+      set_entry(node, key, xml_value(source, depth + 1))
+    end
+    skip_xml_space(source)
+  end
+end
+
+function xml_value(source, depth)
+  count_value(source, depth)
+  local first = source.next
+  local name, ending = take(source, "<(%a+)%s*(/?)>")
+  if name ~= "dict" and name ~= "array" then
+    return xml_scalar(source, name or refuse(), first, ending == "/")
+  end
+  local node = name == "dict" and new_dictionary() or { kind = "array", elements = {} }
+  if ending == "" then fill_container(source, node, depth) end
+  node.at, node.length = first - 1, source.next - first
+  return node
+end
+
+-- What stands before the list.
+local function take_prolog(source)
+  take(source, "\239\187\191")
+  local declaration = take(source, "(<%?xml%s[^?<>&]*%?>)")
+  if declaration and declaration:find("encoding", 1, true) then
+    local at = declaration:find("encoding", 1, true)
+    local _, encoding = declaration:match("^encoding%s*=%s*([\"'])([%w-]+)%1", at)
+    encoding = (encoding or refuse()):upper()
+    if encoding ~= "UTF-8" and encoding ~= "US-ASCII" then refuse() end
+  end
+  skip_xml_space(source)
+  local document_type = take(source, "<!DOCTYPE(%s[^%[<>']*)>")
+  if document_type then
+    local _, quotes = document_type:gsub('"', "")
+    if quotes % 2 ~= 0 then refuse() end
+  end
+  skip_xml_space(source)
+end
+
+local function read_xml(source)
+  if not is_utf8(source.bytes) or source.bytes:find("[%z\1-\8\11\12\14-\31]") then refuse() end
+  source.next = 1
+  take_prolog(source)
+  if not take(source, "<plist%s*>") and not take(source, '<plist%s+version="[^"<>&]*"%s*>') then
+    refuse()
+  end
+  skip_xml_space(source)
+  local node = xml_value(source, 1)
+  skip_xml_space(source)
+  if not take(source, "</plist%s*>") then refuse() end
+  skip_xml_space(source)
+  if source.next <= #source.bytes then refuse() end
+  return node
+end
+
+-- The old text form: { key = value; }, ( a, b ), <0fbd77>, "quoted" or bare strings, comments as in
+-- C++.
+
+local ESCAPES = {
+  a = "\a", b = "\b", f = "\f", n = "\n", r = "\r", t = "\t", v = "\v",
+  ['"'] = '"', ["'"] = "'", ["\\"] = "\\", ["\n"] = "\n",
+}
+
+local function skip_text_space(source)
+  repeat
+    take(source, "[ \t-\r]*")
+    local is_comment = take(source, "//[^\r\n]*")
+    if take(source, "/%*") then
+      local _, last = source.bytes:find("*/", source.next, true)
+      source.next = (last or refuse()) + 1
+      is_comment = true
+    end
+  until not is_comment
+end
+
+-- The code point behind "\U", for which two escapes may stand.
+local function unicode_escape(source)
+  local code = tonumber(take(source, "[Uu](%x%x%x%x)") or refuse(), 16)
+  if code < 0xD800 or code > 0xDFFF then return utf8_of(code) end
+  local low = tonumber(take(source, "\\[Uu](%x%x%x%x)") or refuse(), 16)
+  if code >= 0xDC00 or low < 0xDC00 or low > 0xDFFF then refuse() end
+  return utf8_of(0x10000 + (code - 0xD800) * 1024 + low - 0xDC00)
+end
+
+local function escape(source)
+  local octal = take(source, "([0-7][0-7]?[0-7]?)")
+  if octal then
+    local code = tonumber(octal, 8)
+    return code <= 0xFF and utf8_of(code) or refuse()
+  end
+  if source.bytes:find("^[Uu]", source.next) then return unicode_escape(source) end
+  return ESCAPES[take(source, "(.)") or refuse()] or refuse()
+end
+
+local function string_of(source)
+  local quote = take(source, "([\"'])")
+  if not quote then return take(source, "([A-Za-z0-9_$/:.-]+)") or refuse() end
+  local pieces = {}
+  while not take(source, quote) do
+    local piece = take(source, "([^\\" .. quote .. "]+)")
+    pieces[#pieces + 1] = piece or take(source, "\\") and escape(source) or refuse()
+  end
+  return table.concat(pieces)
+end
+
+local function data_of(source)
+  local digits = take(source, "<([%x \t-\r]*)>") or refuse()
+  digits = digits:gsub("%X", "")
+  if #digits % 2 ~= 0 then refuse() end
+  return base64_text((digits:gsub("%x%x", function(byte) return string.char(tonumber(byte, 16)) end)))
+end
+
+local text_value -- defined below: a container holds values
+
+local function fill_text_container(source, node, depth)
+  local is_array = node.kind == "array"
+  local closing, separator = is_array and "%)" or "}", is_array and "," or ";"
+  skip_text_space(source)
+  while not take(source, closing) do
+    if is_array then
+      node.elements[#node.elements + 1] = text_value(source, depth + 1)
+    else
+      local key = string_of(source)
+      skip_text_space(source)
+      if not take(source, "=") then refuse() end
+      set_entry(node, key, text_value(source, depth + 1))
+    end
+    skip_text_space(source)
+    local is_followed = take(source, separator)
+    skip_text_space(source)
+    if not is_followed and not source.bytes:find("^" .. closing, source.next) then refuse() end
+  end
+end
+
+function text_value(source, depth)
+  skip_text_space(source)
+  count_value(source, depth)
+  local first = source.next
+  local node
+  if take(source, "{") then
+    node = new_dictionary()
+    fill_text_container(source, node, depth)
+  elseif take(source, "%(") then
+    node = { kind = "array", elements = {} }
+    fill_text_container(source, node, depth)
+  elseif source.bytes:find("^<", first) then
+    node = { kind = "data", text = data_of(source) }
+  else
+    node = { kind = "string", text = string_of(source) }
+  end
+  node.at, node.length = first - 1, source.next - first
+  return node
+end
+
+local function read_text(source)
+  if not is_utf8(source.bytes) then refuse() end
+  source.next = 1
+  take(source, "\239\187\191")
+  local node = text_value(source, 1)
+  skip_text_space(source)
+  if source.next <= #source.bytes then refuse() end
+  return node
+end
+
+-- What is displayed of property lists.
+
+local RADIO_ACCESS_TECHNOLOGY = "kHXCellMonitorCellRadioAccessTechnology"
+local CELL_TYPE = "kHXCellMonitorCellType"
+
+local readers = { binary = read_binary, XML = read_xml, text = read_text }
+
+local function form_of(bytes)
+  if bytes:find("^bplist") then return "binary" end
+  if bytes:find("^\254\255") or bytes:find("^\255\254") then return "XML" end -- UTF-16
+  local start = bytes:match("^\239\187\191()") or 1
+  return bytes:find("^[ \t\r\n]*<[?!p]", start) and "XML" or "text"
+end
+
+-- The bytes, their form and the root of what they hold, which is nothing where they cannot be read.
+local function read_property_list(range)
+  local bytes = range:raw()
+  local list = { range = range, form = form_of(bytes) }
+  local source = { range = range, bytes = bytes, values = 0 }
+  local is_read, result = pcall(readers[list.form], source)
+  if not is_read and result ~= REFUSAL then error(result, 0) end
+  list.root = is_read and result or nil
+  return list
+end
+
+local function add_list_label(tree, list)
+  local label = string.format("Property list, %s, %d bytes", list.form, list.range:len())
+  local item = tree:add(list.range, label)
+  if not list.root then item:append_text(" (not read)") end
+end
+
+-- A text from outside in one line.
+local function printable(text)
+  return (text:gsub("\194[\128-\159]", "\239\191\189"):gsub("%c", "\239\191\189"))
+end
+
+-- Values as they come
+
+local function range_of_node(list, node)
+  return list.range:range(node.at, node.length)
+end
+
+local add_entries -- defined below: a value may hold others
+
+local function add_elements(context, tree, elements, filters)
+  for index, node in ipairs(elements) do
+    local range = range_of_node(context.list, node)
+    if node.text then
+      tree:add(range, printable(node.text))
+    else
+      add_entries(context, tree:add(range, "Entry " .. (index - 1)), node, filters)
+    end
+  end
+end
+
+-- A value under a key; `filter` is what the key can be filtered by, where that is known, and
+-- `filters` the same for the keys that the value holds.
+local function add_value(context, tree, key, node, filter, filters)
+  local range = range_of_node(context.list, node)
+  if node.text then
+    add_labelled(context, tree, filter, range, node.text, nil, printable(key .. ": " .. node.text))
+  else
+    add_entries(context, tree:add(range, printable(key)), node, filters)
+  end
+end
+
+function add_entries(context, tree, node, filters)
+  if node.elements then return add_elements(context, tree, node.elements, filters) end
+  for _, entry in ipairs(node.entries) do
+    if entry.key then
+      add_value(context, tree, entry.key, entry.value, filters and filters[entry.key], filters)
+    end
+  end
+end
+
+-- The cell monitor
+
+local function is_cell(node, wanted)
+  local technology, cell_type = find(node, RADIO_ACCESS_TECHNOLOGY), find(node, CELL_TYPE)
+  if not technology or not cell_type then return false end
+  local is_type = cell_type.kind == "string" and cell_type.text == wanted.cell_type
+  for _, name in ipairs(wanted.technologies) do
+    if is_type and technology.kind == "string" and technology.text == name then return true end
+  end
+  return false
+end
+
+local function cells_of(root, wanted)
+  local cells = {}
+  for _, node in ipairs(root.elements or {}) do
+    if is_cell(node, wanted) then cells[#cells + 1] = node end
+  end
+  return cells
+end
+
+-- The last of the cells that has a number for a field stays.
+local function add_cell_fields(context, tree, fields, cells)
+  for _, field in ipairs(fields) do
+    local shown
+    for _, cell in ipairs(cells) do
+      local node = find(cell, field.list_key)
+      shown = node and int32_of(node) and node or shown
+    end
+    if shown then
+      local number = int32_of(shown)
+      local text, value = text_of(field, field.low_bits and signed(number, field.low_bits) or number)
+      add_item(context, tree, field, range_of_node(context.list, shown), text, value)
+    end
+  end
+end
+
+-- Sections
+
+local list_sections = {}
+
+list_sections["keys"] = function(context, root, part)
+  local node = context.list.root
+  local tree = root:add(range_of_node(context.list, node), part.head.section)
+  for _, field in ipairs(part.fields) do
+    local value = find(node, field.list_key)
+    if value then add_value(context, tree, field.key, value, field.filter) end
+  end
+end
+
+list_sections["elements"] = function(context, root, part)
+  local node = context.list.root
+  local tree = root:add(range_of_node(context.list, node), part.head.section)
+  if node.elements then
+    add_elements(context, tree, node.elements)
+  else
+    tree:append_text(" (no array)")
+  end
+end
+
+list_sections["each cell"] = function(context, root, part)
+  local cells = cells_of(context.list.root, part.list)
+  local last = cells[#cells] or context.list.root
+  local tree = root:add(range_of_node(context.list, last), part.head.section)
+  if #cells == 0 then tree:append_text(" (no such cell)") end
+  add_cell_fields(context, tree, part.fields, cells)
+end
+
+list_sections["first cell"] = function(context, root, part)
+  local first = cells_of(context.list.root, part.list)[1]
+  local tree = root:add(range_of_node(context.list, first or context.list.root), part.head.section)
+  if not first then return tree:append_text(" (no such cell)") end
+  add_cell_fields(context, tree, part.fields, { first })
+end
+
+list_sections["cell entries"] = function(context, root, part)
+  local tree = root:add(range_of_node(context.list, context.list.root), part.head.section)
+  for index, cell in ipairs(cells_of(context.list.root, part.list)) do
+    local entry = tree:add(range_of_node(context.list, cell), "Entry " .. (index - 1))
+    add_cell_fields(context, entry, part.fields, { cell })
+  end
+end
+
+-- The sections of a record whose body is a property list.
+local function add_list_sections(context, tree, parts)
+  local has_body = context.record:len() > HEADER_LENGTH
+  context.list = has_body and read_property_list(context.record:range(HEADER_LENGTH))
+    or { range = context.record:range() }
+  for _, part in ipairs(parts) do
+    if context.list.root then
+      list_sections[part.list.part](context, tree, part)
+    else
+      tree:add(context.list.range, part.head.section):append_text(" (not read)")
+    end
+  end
+  if has_body then add_list_label(tree, context.list) end
+end
+
+-- Object streams
+
+local folded -- defined below: an object holds others
+
+-- A dictionary of one entry gives way to its value, and the first element of an array is left out.
+-- Nothing where a value is of a type that no object holds.
+local function display_form(node)
+  if node.kind == "string" then return node end
+  local form = { kind = node.kind, at = node.at, length = node.length }
+  if node.kind == "dictionary" then
+    form.entries = {}
+    for index, entry in ipairs(node.entries) do
+      local value = folded(entry.value)
+      if not value then return nil end
+      form.entries[index] = { key = entry.key, value = value }
+    end
+    return form
+  end
+  if node.kind ~= "array" then return nil end
+  form.elements = {}
+  for index, element in ipairs(node.elements) do
+    local value = folded(element)
+    if not value then return nil end
+    form.elements[index - 1] = value
+  end
+  form.elements[0] = nil
+  return form
+end
+
+function folded(node)
+  local form = display_form(node)
+  local is_single = form and form.entries and #form.entries == 1
+  return is_single and form.entries[1].value or form
+end
+
+local function add_object_sections(context, tree, form)
+  for _, entry in ipairs(form.entries) do
+    local known = context.technology.objects[entry.key] or {}
+    if entry.key then
+      add_value(context, tree, entry.key, entry.value, known.filter, known.keys)
+    end
+  end
+end
+
+local function dissect_object(technology, buffer, pinfo, tree)
+  local context = { technology = technology, pinfo = pinfo }
+  context.list = read_property_list(buffer:range())
+  local form = context.list.root and display_form(context.list.root)
+  if form and form.entries then
+    add_object_sections(context, tree, form)
+  elseif form and form.elements then
+    add_elements(context, tree, form.elements)
+  elseif form then
+    tree:add(range_of_node(context.list, form), printable(form.text))
+  elseif context.list.root then
+    tree:append_text(" (an object of an unknown type)")
+  end
+  add_list_label(tree, context.list)
+end
+
 -- Records
 
 -- Where the subpacket begins; nothing when there is none.
@@ -1461,32 +2481,6 @@ local function add_section(context, root, part)
   end
 end
 
-local function unescaped(text)
-  local entities = { lt = "<", gt = ">", amp = "&", quot = '"', apos = "'" }
-  return (text:gsub("&(%a+);", entities))
-end
-
--- A serialized property list: of the XML form the keys whose values are simple.
-local function add_property_list(record, tree, start)
-  if start >= record:len() then return end
-  local range = record:range(start)
-  local text = range:raw()
-  local is_xml = text:find("<plist", 1, true) ~= nil
-  local label = (is_xml and "Property list, XML, " or "Property list, ") .. #text .. " bytes"
-  local list = tree:add(range, label)
-  if not is_xml then return end
-  local at = 1
-  for _ = 1, MOST_PROPERTIES do
-    local first, last, key, kind, value = text:find("<key>([^<]*)</key>%s*<(%a+)>([^<]*)</", at)
-    if not first then return end
-    if kind ~= "dict" and kind ~= "array" then
-      local item = unescaped(key) .. ": " .. unescaped(value)
-      list:add(range_of(record, start + first - 1, last - first + 1), item)
-    end
-    at = last
-  end
-end
-
 -- The record without its transport prefix; nothing where that leaves nothing.
 local function without_prefix(buffer)
   if buffer:len() == 0 then return nil end
@@ -1524,17 +2518,16 @@ local function dissect_record(technology, buffer, pinfo, tree)
   if is_strict and type ~= STANDARD_TYPE and type ~= EXTENDED_TYPE then
     return tree:append_text(" (invalid log type)")
   end
-  local has_property_list = false
   local context = { technology = technology, record = record, pinfo = pinfo, start = 0 }
+  local of_lists = {}
   for _, part in ipairs(known or {}) do
-    if part.head.property_list then
-      has_property_list = true
-      tree:add(record:range(), "For " .. part.head.section)
+    if part.list then
+      of_lists[#of_lists + 1] = part
     else
       add_section(context, tree, part)
     end
   end
-  if has_property_list then add_property_list(record, tree, HEADER_LENGTH) end
+  if #of_lists > 0 then add_list_sections(context, tree, of_lists) end
 end
 
 -- Registration
@@ -1545,20 +2538,28 @@ local function each_field(part, see)
   for _, subpacket in ipairs(part.subpackets or {}) do each_field(subpacket, see) end
 end
 
+-- The keys of an object stream as fields whose values are texts.
+local function each_object_key(technology, see)
+  for section, known in pairs(technology.objects or {}) do
+    see({ key = section, filter = known.filter })
+    for key, filter in pairs(known.keys) do see({ key = key, filter = filter }) end
+  end
+end
+
 -- A field to filter by for each key: a number where every value of the key is one.
 local function make_fields(technology)
   technology.fields = {}
   local names = {}
-  for _, code in pairs(technology.codes) do
-    for _, part in ipairs(code) do
-      each_field(part, function(field)
-        local known = technology.fields[field.filter] or { is_number = true, name = field.key }
-        known.is_number = known.is_number and field.format ~= nil
-        if not technology.fields[field.filter] then names[#names + 1] = field.filter end
-        technology.fields[field.filter] = known
-      end)
-    end
+  local function see(field)
+    local known = technology.fields[field.filter] or { is_number = true, name = field.key }
+    known.is_number = known.is_number and field.format ~= nil
+    if not technology.fields[field.filter] then names[#names + 1] = field.filter end
+    technology.fields[field.filter] = known
   end
+  for _, code in pairs(technology.codes) do
+    for _, part in ipairs(code) do each_field(part, see) end
+  end
+  each_object_key(technology, see)
   local all = {}
   for _, name in ipairs(names) do
     local known = technology.fields[name]
@@ -1590,7 +2591,7 @@ local function register(technology)
     pinfo.cols.protocol = technology.title
     local tree = root:add(proto, buffer())
     if technology.framing == "object" then
-      add_property_list(buffer, tree, 0)
+      dissect_object(technology, buffer, pinfo, tree)
     else
       dissect_record(technology, buffer, pinfo, tree)
     end

@@ -1,15 +1,20 @@
 -- Items
 
-local function add_item(context, tree, field, range, text, value)
-  local label = field.key ~= "" and field.key .. ": " .. text or text
-  local known = context.technology.fields[field.filter]
-  if known.is_number and value and value == value then
+-- An item with its label; under `filter` also with what it can be filtered by, where that is known.
+local function add_labelled(context, tree, filter, range, text, value, label)
+  local known = filter and context.technology.fields[filter]
+  if known and known.is_number and value and value == value then
     tree:add(known.field, range, value, label)
-  elseif not known.is_number then
+  elseif known and not known.is_number then
     tree:add(known.field, range, text, label)
   else
-    tree:add(range, label) -- a text where others of the key are numbers
+    tree:add(range, label) -- also a text where others of the key are numbers
   end
+end
+
+local function add_item(context, tree, field, range, text, value)
+  local label = field.key ~= "" and field.key .. ": " .. text or text
+  add_labelled(context, tree, field.filter, range, text, value, label)
 end
 
 local function number_of(context, condition)

@@ -9,7 +9,6 @@ local EXTENDED_CODES = 0xFF0000
 local PREFIX, PREFIX_LENGTH = 0x81, 2
 local SUBPACKET_COUNT, FIRST_SUBPACKET = 14, 17
 local TRAFFIC = 8 -- the 1x device state
-local MOST_PROPERTIES = 1000
 
 -- Numbers
 

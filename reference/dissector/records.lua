@@ -39,32 +39,6 @@ local function add_section(context, root, part)
   end
 end
 
-local function unescaped(text)
-  local entities = { lt = "<", gt = ">", amp = "&", quot = '"', apos = "'" }
-  return (text:gsub("&(%a+);", entities))
-end
-
--- A serialized property list: of the XML form the keys whose values are simple.
-local function add_property_list(record, tree, start)
-  if start >= record:len() then return end
-  local range = record:range(start)
-  local text = range:raw()
-  local is_xml = text:find("<plist", 1, true) ~= nil
-  local label = (is_xml and "Property list, XML, " or "Property list, ") .. #text .. " bytes"
-  local list = tree:add(range, label)
-  if not is_xml then return end
-  local at = 1
-  for _ = 1, MOST_PROPERTIES do
-    local first, last, key, kind, value = text:find("<key>([^<]*)</key>%s*<(%a+)>([^<]*)</", at)
-    if not first then return end
-    if kind ~= "dict" and kind ~= "array" then
-      local item = unescaped(key) .. ": " .. unescaped(value)
-      list:add(range_of(record, start + first - 1, last - first + 1), item)
-    end
-    at = last
-  end
-end
-
 -- The record without its transport prefix; nothing where that leaves nothing.
 local function without_prefix(buffer)
   if buffer:len() == 0 then return nil end
@@ -102,17 +76,16 @@ local function dissect_record(technology, buffer, pinfo, tree)
   if is_strict and type ~= STANDARD_TYPE and type ~= EXTENDED_TYPE then
     return tree:append_text(" (invalid log type)")
   end
-  local has_property_list = false
   local context = { technology = technology, record = record, pinfo = pinfo, start = 0 }
+  local of_lists = {}
   for _, part in ipairs(known or {}) do
-    if part.head.property_list then
-      has_property_list = true
-      tree:add(record:range(), "For " .. part.head.section)
+    if part.list then
+      of_lists[#of_lists + 1] = part
     else
       add_section(context, tree, part)
     end
   end
-  if has_property_list then add_property_list(record, tree, HEADER_LENGTH) end
+  if #of_lists > 0 then add_list_sections(context, tree, of_lists) end
 end
 
 -- Registration
@@ -123,20 +96,28 @@ local function each_field(part, see)
   for _, subpacket in ipairs(part.subpackets or {}) do each_field(subpacket, see) end
 end
 
+-- The keys of an object stream as fields whose values are texts.
+local function each_object_key(technology, see)
+  for section, known in pairs(technology.objects or {}) do
+    see({ key = section, filter = known.filter })
+    for key, filter in pairs(known.keys) do see({ key = key, filter = filter }) end
+  end
+end
+
 -- A field to filter by for each key: a number where every value of the key is one.
 local function make_fields(technology)
   technology.fields = {}
   local names = {}
-  for _, code in pairs(technology.codes) do
-    for _, part in ipairs(code) do
-      each_field(part, function(field)
-        local known = technology.fields[field.filter] or { is_number = true, name = field.key }
-        known.is_number = known.is_number and field.format ~= nil
-        if not technology.fields[field.filter] then names[#names + 1] = field.filter end
-        technology.fields[field.filter] = known
-      end)
-    end
+  local function see(field)
+    local known = technology.fields[field.filter] or { is_number = true, name = field.key }
+    known.is_number = known.is_number and field.format ~= nil
+    if not technology.fields[field.filter] then names[#names + 1] = field.filter end
+    technology.fields[field.filter] = known
   end
+  for _, code in pairs(technology.codes) do
+    for _, part in ipairs(code) do each_field(part, see) end
+  end
+  each_object_key(technology, see)
   local all = {}
   for _, name in ipairs(names) do
     local known = technology.fields[name]
@@ -168,7 +149,7 @@ local function register(technology)
     pinfo.cols.protocol = technology.title
     local tree = root:add(proto, buffer())
     if technology.framing == "object" then
-      add_property_list(buffer, tree, 0)
+      dissect_object(technology, buffer, pinfo, tree)
     else
       dissect_record(technology, buffer, pinfo, tree)
     end

@@ -9,10 +9,14 @@ namespace {
 
 constexpr std::size_t kIndent = 4;
 
-/// The last item at a depth.
-AnalyserItem& lastAt(AnalyserItem& root, std::size_t depth) {
+/// The last item at a depth, or the deepest above it.
+AnalyserItem& lastAt(AnalyserItem& root, std::size_t& depth) {
     AnalyserItem* item = &root;
-    for (std::size_t level = 0; level < depth && !item->items.empty(); ++level) {
+    for (std::size_t level = 0; level < depth; ++level) {
+        if (item->items.empty()) {
+            depth = level;
+            break;
+        }
         item = &item->items.back();
     }
     return *item;
@@ -40,14 +44,16 @@ std::vector<AnalyserItem> packetsIn(const std::string& text, const std::string& 
     bool inside = false;
     std::istringstream lines(text);
     for (std::string line; std::getline(lines, line);) {
-        const std::size_t indent = line.find_first_not_of(' ');
-        if (indent == 0 || indent == std::string::npos) {
+        const std::size_t indent = std::min(line.find_first_not_of(' '), line.size());
+        if (indent < kIndent) {
             inside = line.starts_with(title);
             if (inside) {
                 packets.push_back({line, {}});
             }
         } else if (inside) {
-            lastAt(packets.back(), indent / kIndent - 1).items.push_back({line.substr(indent), {}});
+            std::size_t depth = indent / kIndent - 1; // or less, of a label that begins with blanks
+            AnalyserItem& holder = lastAt(packets.back(), depth);
+            holder.items.push_back({line.substr((depth + 1) * kIndent), {}});
         }
     }
     return packets;
