@@ -31,7 +31,7 @@ ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, c
         complain(sentence);
     };
     DecodeCommand command(options, {resources, bundle, notices, technologies()}, Recording::open,
-                          report, &progress);
+                          report, progress.isShown() ? &progress : nullptr);
     return use(command);
 }
 
