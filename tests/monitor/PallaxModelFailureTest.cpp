@@ -17,10 +17,6 @@ protected:
         EXPECT_EQ(ports.remote(), nullptr);
         EXPECT_TRUE(retriesAfter5Seconds());
     }
-    void expectQueryFailure(const std::string& text) {
-        start();
-        EXPECT_EQ(log.lines(), (Lines{{3, text}, {3, kNoGenerator}}));
-    }
 };
 
 TEST_F(PallaxModelFailureTest, ALocalPortThatCannotBeMadeFailsTheStart) {
