@@ -1,4 +1,5 @@
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Files.h"
+#include "tests/doubles/Shell.h"
 
 #include <gtest/gtest.h>
 

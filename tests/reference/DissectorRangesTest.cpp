@@ -1,4 +1,4 @@
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Shell.h"
 #include "tests/reference/ReferenceFixture.h"
 
 #include <gtest/gtest.h>

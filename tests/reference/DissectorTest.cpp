@@ -1,6 +1,7 @@
 #include "host/RecordingWriter.h"
 #include "samples/Samples.h"
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Files.h"
+#include "tests/doubles/Shell.h"
 #include "tests/reference/AnalyserTree.h"
 #include "tests/reference/ReferenceFixture.h"
 
