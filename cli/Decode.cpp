@@ -1,7 +1,6 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "cli/DecodeProgress.h"
 #include "cli/DroppedNotices.h"
-#include "cli/MonotonicClock.h"
 #include "cli/OrderedWorkers.h"
 #include "cli/Preconditions.h"
 #include "cli/Programs.h"
@@ -9,6 +8,7 @@
 #include "host/BuildBundle.h"
 #include "host/DirectoryResources.h"
 #include "host/LogSinks.h"
+#include "host/MonotonicClock.h"
 #include "platform/Format.h"
 
 #include <algorithm>
@@ -31,7 +31,7 @@ ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, c
         complain(sentence);
     };
     DecodeCommand command(options, {resources, bundle, notices, technologies()}, Recording::open,
-                          report, &progress);
+                          report, progress.isShown() ? &progress : nullptr);
     return use(command);
 }
 

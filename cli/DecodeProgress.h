@@ -28,6 +28,8 @@ public:
     void packetDone(std::size_t recording, const Recording& source, std::uint64_t packets) override;
     void recordingDone(std::size_t recording) override;
 
+    /// False without a terminal: then nothing needs to be counted.
+    bool isShown() const { return _tallies != nullptr; }
     /// In a forked process, which counts but shows nothing.
     void becomeWorker() { _isWorker = true; }
     /// Shows what is counted, if it is time.

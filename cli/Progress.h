@@ -20,7 +20,8 @@ public:
     explicit ProgressPace(const Clock& clock) : _clock(clock), _begin(clock.now()), _look(_begin) {}
 
     /// To be asked after each little piece of the run. It looks at the clock rarely where the
-    /// pieces are quick, and at each of them where they are slow.
+    /// pieces are quick, and at each of them once they are found to be slow: the first slow ones,
+    /// up to 63, go unseen.
     bool isDue() {
         if (++_pieces < _piecesPerLook) {
             return false;

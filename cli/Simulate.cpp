@@ -1,7 +1,7 @@
-#include "cli/MonotonicClock.h"
 #include "cli/Programs.h"
 #include "cli/Progress.h"
 #include "cli/TerminalLine.h"
+#include "host/MonotonicClock.h"
 #include "telephony/simulator/SimulatedRecording.h"
 
 #include <chrono>

@@ -28,7 +28,8 @@ public:
     /// Runs blocks, waiting for them, until `stop`. An exception of a block leaves through here;
     /// run may then be called again and goes on with the next block.
     void run();
-    /// Runs what is ready now, without waiting; what those blocks post included.
+    /// Runs what is ready now, without waiting; what those blocks post included. For tests and fuzz
+    /// targets, which step the queue; the programs run it.
     void runReady();
     /// Makes `run` return after the present block, or the next `run` return at once.
     void stop();

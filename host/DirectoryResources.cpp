@@ -21,14 +21,15 @@ std::string DirectoryResources::programFolder() {
         return chosen;
     }
     std::error_code error;
-    const auto program = std::filesystem::read_symlink("/proc/self/exe", error);
-    const auto installed = program.parent_path().parent_path() / "share" / "pallax";
-#ifdef PALLAX_SOURCE_RESOURCES
-    if (!std::filesystem::is_directory(installed, error)) {
-        return PALLAX_SOURCE_RESOURCES;
-    }
-#endif
-    return installed.native();
+    return folderFor(std::filesystem::read_symlink("/proc/self/exe", error).native());
+}
+
+std::string DirectoryResources::folderFor(const std::string& program) {
+    const auto folder = std::filesystem::path(program).parent_path();
+    const auto part = std::filesystem::path("share") / "pallax";
+    std::error_code error;
+    const bool isBuilt = std::filesystem::is_directory(folder / part, error);
+    return ((isBuilt ? folder : folder.parent_path()) / part).native();
 }
 
 std::optional<PropertyList> DirectoryResources::propertyList(std::string_view name) const {

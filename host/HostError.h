@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 
 namespace pallax {
 
@@ -10,5 +11,8 @@ struct HostError {
     /// What was written to is a pipe that nobody reads any more: a reason to end quietly.
     bool readerHasGone = false;
 };
+
+/// That a recording cannot be written, as the system's error number tells.
+HostError unwritableRecording(std::string_view name, int error);
 
 } // namespace pallax

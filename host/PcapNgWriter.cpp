@@ -94,11 +94,6 @@ ByteBuffer sectionHeader() {
         .finish();
 }
 
-HostError failureOf(std::string_view name, int error) {
-    return {formatText("The recording %@ cannot be written: %@.", {name, std::strerror(error)}),
-            error == EPIPE};
-}
-
 } // namespace
 
 Result<std::unique_ptr<PcapNgWriter>, HostError> PcapNgWriter::create(const std::string& path,
@@ -111,7 +106,7 @@ Result<std::unique_ptr<PcapNgWriter>, HostError> PcapNgWriter::create(const std:
     if (!toOutput && !file) {
         return errno == EEXIST
                    ? HostError{formatText("%@ exists already; --overwrite replaces it.", {path})}
-                   : failureOf(path, errno);
+                   : unwritableRecording(path, errno);
     }
     const int number = toOutput ? STDOUT_FILENO : file.number();
     std::unique_ptr<PcapNgWriter> writer(
@@ -178,7 +173,7 @@ std::optional<HostError> PcapNgWriter::put(const ByteBuffer& block) {
             if (_file) { // standard output's reader has the rest already
                 (void)!::ftruncate(_number, static_cast<off_t>(_size));
             }
-            return failureOf(_name, error);
+            return unwritableRecording(_name, error);
         }
         written += static_cast<std::size_t>(count);
     }

@@ -71,7 +71,8 @@ public:
     std::optional<PortFrame> take();
     /// What the peer did wrong ("an unknown kind of frame"); empty while nothing.
     std::string_view fault() const { return _fault; }
-    /// True in the middle of a frame: a stream that ends here is cut.
+    /// True in the middle of a frame: a stream that ends here is cut. For tests and fuzz targets; a
+    /// port takes the end of a stream as the end wherever it comes.
     bool isInsideFrame() const { return _headerSize > 0 && !_whole; }
 
 private:

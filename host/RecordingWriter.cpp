@@ -7,7 +7,6 @@
 #include <cstdint>
 #include <cstring>
 #include <limits>
-#include <string_view>
 
 namespace pallax {
 
@@ -28,11 +27,6 @@ void append(ByteBuffer& out, const std::array<std::uint32_t, kCount>& numbers) {
     out.insert(out.end(), bytes.begin(), bytes.end());
 }
 
-HostError failureOf(std::string_view name, int error) {
-    return {formatText("The recording %@ cannot be written: %@.", {name, std::strerror(error)}),
-            error == EPIPE};
-}
-
 /// The file's header, of 24 bytes.
 ByteBuffer fileHeader(int linkType) {
     constexpr std::uint32_t kNanosecondMagic = 0xA1B23C4D;
@@ -51,7 +45,7 @@ Result<std::unique_ptr<RecordingWriter>, HostError>
 RecordingWriter::create(const std::string& path, int linkType, Flush flush) {
     std::FILE* file = path == "-" ? stdout : std::fopen(path.c_str(), "wbe");
     if (file == nullptr) {
-        return failureOf(path, errno);
+        return unwritableRecording(path, errno);
     }
     std::unique_ptr<RecordingWriter> writer(
         new RecordingWriter(path == "-" ? "standard output" : path, file, flush));
@@ -94,7 +88,7 @@ std::optional<HostError> RecordingWriter::flush() {
         std::fflush(_file) == 0;
     _pending.clear();
     if (!isWritten) {
-        return failureOf(_name, errno);
+        return unwritableRecording(_name, errno);
     }
     return std::nullopt;
 }

@@ -296,18 +296,4 @@ void Dictionary::rebuildIndex() {
     }
 }
 
-bool sameInOrder(const Dictionary& a, const Dictionary& b) {
-    if (a.size() != b.size()) {
-        return false;
-    }
-    auto other = b.begin();
-    for (const Dictionary::Entry& entry : a) {
-        if (!(entry.key == other->key) || !(entry.value == other->value)) {
-            return false;
-        }
-        ++other;
-    }
-    return true;
-}
-
 } // namespace pallax

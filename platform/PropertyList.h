@@ -207,7 +207,4 @@ private:
     std::size_t _next = 0;
 };
 
-/// The same order of keys and the same values; what tests of "in this order" compare.
-bool sameInOrder(const Dictionary& a, const Dictionary& b);
-
 } // namespace pallax

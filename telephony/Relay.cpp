@@ -15,10 +15,6 @@ constexpr std::chrono::seconds kLookInterval{1};
 /// So many packets are handed on before other blocks get their turn.
 constexpr int kPacketsPerBlock = 100;
 
-long long secondsOf(std::chrono::steady_clock::duration time) {
-    return std::chrono::duration_cast<std::chrono::seconds>(time).count();
-}
-
 } // namespace
 
 /// What a source and its relay share.
@@ -132,7 +128,8 @@ void Relay::step() {
 void Relay::handOn(const PacketSource::Packet& packet) {
     const auto now = _setup.steadyNow();
     if (std::exchange(_stalled, false)) {
-        _setup.report(formatText("The stream goes on after %lld s.", {secondsOf(now - _heard)}));
+        _setup.report(formatText("The stream goes on after %lld s.",
+                                 {std::chrono::floor<std::chrono::seconds>(now - _heard).count()}));
     }
     _heard = now;
     ++_packets;
@@ -165,8 +162,8 @@ void Relay::look() {
     const auto silence = _setup.steadyNow() - _heard;
     if (!_stalled && silence >= kStall) {
         _stalled = true;
-        _setup.report(
-            formatText("The stream has stalled: no packet for %lld s.", {secondsOf(silence)}));
+        _setup.report(formatText("The stream has stalled: no packet for %lld s.",
+                                 {std::chrono::floor<std::chrono::seconds>(silence).count()}));
     }
 }
 

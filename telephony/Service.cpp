@@ -6,10 +6,10 @@
 #include "telephony/RecordingSource.h"
 #include "telephony/Relay.h"
 #include "telephony/ServiceStatus.h"
+#include "telephony/SimulatedSource.h"
 #include "telephony/StreamOpening.h"
 #include "telephony/StreamSource.h"
 #include "telephony/TelephonyServer.h"
-#include "telephony/simulator/SimulatedSource.h"
 
 #include <array>
 #include <cerrno>

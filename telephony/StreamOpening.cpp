@@ -12,10 +12,6 @@ namespace {
 
 using Clock = std::chrono::steady_clock;
 
-long long secondsOf(Clock::duration time) {
-    return std::chrono::duration_cast<std::chrono::seconds>(time).count();
-}
-
 /// Looks on while somebody else waits.
 class Watch {
 public:
@@ -42,8 +38,9 @@ private:
         std::unique_lock lock(_mutex);
         if (!_over.wait_for(lock, _opening.patience, [this] { return _isOver; })) {
             _hasReported = true;
-            _opening.report(formatText("The stream has stalled: no header for %lld s.",
-                                       {secondsOf(_opening.patience)}));
+            _opening.report(
+                formatText("The stream has stalled: no header for %lld s.",
+                           {std::chrono::floor<std::chrono::seconds>(_opening.patience).count()}));
         }
     }
 
@@ -64,7 +61,8 @@ StreamOpening::Opened openStream(const StreamOpening& opening) {
     const bool hasStalled = watch.end();
     if (hasStalled && opened) {
         opening.report(
-            formatText("The stream goes on after %lld s.", {secondsOf(Clock::now() - begun)}));
+            formatText("The stream goes on after %lld s.",
+                       {std::chrono::floor<std::chrono::seconds>(Clock::now() - begun).count()}));
     }
     return opened;
 }

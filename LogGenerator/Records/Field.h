@@ -59,7 +59,6 @@ public:
     /// The same in place of what `value` was before.
     void showIn(PropertyList& value, std::int64_t raw) const;
 
-    constexpr bool isNumber() const { return _format != nullptr; }
     /// The conversion as data.
     ShownAs shownAs() const;
 

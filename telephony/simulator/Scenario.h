@@ -43,7 +43,6 @@ public:
     bool hasNewServingCell() const { return _hasNewServingCell; }
     /// The latest step brought another serving layer. So does the first moment.
     bool hasNewLayer() const { return _hasNewLayer; }
-    double speed_mps() const { return _speed_mps; }
 
 private:
     void move();

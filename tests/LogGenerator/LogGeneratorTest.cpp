@@ -3,6 +3,7 @@
 #include "LogGenerator/Records/Exceptions.h"
 #include "tests/doubles/FakeGenerator.h"
 #include "tests/doubles/GeneratorFixture.h"
+#include "tests/doubles/InOrder.h"
 #include "tests/doubles/RecordingLog.h"
 
 #include <gtest/gtest.h>
@@ -14,6 +15,7 @@ namespace {
 using doubles::FakeGenerator;
 using doubles::MuteGenerator;
 using doubles::RecordingLog;
+using doubles::sameInOrder;
 using Lines = std::vector<RecordingLog::Line>;
 
 class LogGeneratorTest : public testing::Test {

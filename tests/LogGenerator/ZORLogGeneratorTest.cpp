@@ -1,6 +1,7 @@
 #include "LogGenerator/ZORLogGenerator.h"
 
 #include "tests/doubles/GeneratorFixture.h"
+#include "tests/doubles/InOrder.h"
 #include "tests/doubles/RecordingLog.h"
 
 #include <gtest/gtest.h>
@@ -10,6 +11,7 @@ namespace {
 
 using doubles::GeneratorFixture;
 using doubles::RecordingLog;
+using doubles::sameInOrder;
 using Lines = std::vector<RecordingLog::Line>;
 
 /// A generator with nothing but a capture.

@@ -4,7 +4,7 @@
 #include "tests/doubles/FakeFileSystem.h"
 #include "tests/doubles/FakePreferences.h"
 #include "tests/doubles/FakeToolkit.h"
-#include "tests/monitor/ModelFixture.h"
+#include "tests/doubles/ModelFixture.h"
 
 #include <memory>
 #include <span>

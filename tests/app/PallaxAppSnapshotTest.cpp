@@ -1,6 +1,7 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "platform/PropertyListCodec.h"
 #include "tests/app/AppFixture.h"
+#include "tests/doubles/InOrder.h"
 #include "tests/doubles/RecordBuilder.h"
 #include "tests/doubles/TemplateCheck.h"
 

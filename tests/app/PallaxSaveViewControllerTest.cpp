@@ -3,6 +3,7 @@
 #include "platform/PropertyListCodec.h"
 #include "tests/doubles/FakeFileSystem.h"
 #include "tests/doubles/FakeToolkit.h"
+#include "tests/doubles/InOrder.h"
 #include "tests/doubles/ManualClock.h"
 #include "tests/doubles/RecordingLog.h"
 #include "tests/doubles/SteppedQueue.h"

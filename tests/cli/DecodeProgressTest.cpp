@@ -50,6 +50,7 @@ TEST_F(DecodeProgressTest, TheShareIsThatOfAllBytes) {
     const std::uint64_t both = first + std::filesystem::file_size(kSecond);
     {
         DecodeProgress progress({kFirst, kSecond}, line(), clock);
+        EXPECT_TRUE(progress.isShown());
         readThrough(progress, 0, kFirst);
         EXPECT_TRUE(written.ends_with(percentAfter(first, both))) << written;
         readThrough(progress, 1, kSecond);
@@ -93,6 +94,7 @@ TEST_F(DecodeProgressTest, AMissingRecordingHasNoBytes) {
 
 TEST_F(DecodeProgressTest, WithoutATerminalNothingIsShown) {
     DecodeProgress progress({kFirst}, line(0), clock);
+    EXPECT_FALSE(progress.isShown());
     readThrough(progress, 0, kFirst);
     progress.look();
     EXPECT_EQ(written, "");

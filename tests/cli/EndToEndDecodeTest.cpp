@@ -1,4 +1,5 @@
 #include "tests/cli/EndToEnd.h"
+#include "tests/doubles/Files.h"
 
 #include <nlohmann/json.hpp>
 
@@ -13,6 +14,7 @@
 namespace pallax {
 namespace {
 
+using doubles::contentOf;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
@@ -23,12 +25,6 @@ std::vector<nlohmann::ordered_json> linesOf(const std::string& text) {
         lines.push_back(nlohmann::ordered_json::parse(line));
     }
     return lines;
-}
-
-std::string contentOf(const std::string& path) {
-    std::ostringstream content;
-    content << std::ifstream(path, std::ios::binary).rdbuf();
-    return content.str();
 }
 
 TEST_F(EndToEnd, DecodeGivesTheDisplayAfterTheLastPacket) {

@@ -99,8 +99,14 @@ private:
 
 class EndToEndFaults : public EndToEnd {
 protected:
-    EndToEndFaults() { (void)::setenv("XDG_RUNTIME_DIR", world.folder().c_str(), 1); }
-    ~EndToEndFaults() override { (void)::unsetenv("XDG_RUNTIME_DIR"); }
+    EndToEndFaults() {
+        (void)::setenv("XDG_RUNTIME_DIR", world.path().c_str(), 1);
+        (void)::setenv("PALLAX_RESOURCES", PALLAX_SOURCE_DIR "/resources", 1);
+    }
+    ~EndToEndFaults() override {
+        (void)::unsetenv("XDG_RUNTIME_DIR");
+        (void)::unsetenv("PALLAX_RESOURCES");
+    }
 
     static bool isLogged(const doubles::RecordingLog& log, const std::string& text) {
         return std::any_of(log.lines().begin(), log.lines().end(), [&](const auto& line) {
@@ -226,6 +232,17 @@ TEST_F(EndToEndFaults, After200KilledServicesNothingHasLeakedAndTheViewerIsInVie
     }
     EXPECT_EQ(world.sockets(), std::vector<std::string>());
     EXPECT_TRUE(noChildLeft());
+}
+
+TEST_F(EndToEnd, WithoutDisplayTemplatesThereIsNothingToShow) {
+    const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)}});
+    world.environment = {"PALLAX_RESOURCES=/nonexistent"};
+    for (const Run& failed : {run({"decode", recording}), run({recording, "--print"})}) {
+        EXPECT_EQ(failed.status, 1);
+        EXPECT_EQ(failed.out, "");
+        EXPECT_EQ(failed.err, "pallax: There are no display templates in /nonexistent; "
+                              "PALLAX_RESOURCES names their folder.\n");
+    }
 }
 
 /// Every program that needs the folder of sockets refuses it with the same sentence.

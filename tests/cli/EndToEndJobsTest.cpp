@@ -1,4 +1,5 @@
 #include "tests/cli/EndToEnd.h"
+#include "tests/doubles/Files.h"
 
 #include <algorithm>
 #include <fstream>
@@ -7,6 +8,7 @@
 namespace pallax {
 namespace {
 
+using doubles::contentOf;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
@@ -41,12 +43,6 @@ protected:
         EXPECT_EQ(three.err, one.err);
         EXPECT_EQ(three.status, one.status);
         return three;
-    }
-
-    static std::string contentOf(const std::string& path) {
-        std::ostringstream content;
-        content << std::ifstream(path, std::ios::binary).rdbuf();
-        return content.str();
     }
 };
 

@@ -1,7 +1,7 @@
 #include "host/Recording.h"
 #include "tests/cli/EndToEnd.h"
 #include "tests/cli/PallaxTerminal.h"
-#include "tests/doubles/RuntimeFolder.h"
+#include "tests/doubles/Files.h"
 
 #include <nlohmann/json.hpp>
 

@@ -2,7 +2,7 @@
 
 #include "tests/cli/EndToEnd.h"
 #include "tests/cli/PallaxTerminal.h"
-#include "tests/doubles/RuntimeFolder.h"
+#include "tests/doubles/Files.h"
 
 #include <filesystem>
 #include <fstream>

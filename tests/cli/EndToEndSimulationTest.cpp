@@ -1,9 +1,8 @@
 #include "host/Recording.h"
 #include "telephony/simulator/Simulation.h"
 #include "tests/cli/EndToEnd.h"
+#include "tests/doubles/Files.h"
 
-#include <fstream>
-#include <iterator>
 #include <map>
 #include <set>
 #include <sstream>
@@ -13,13 +12,9 @@
 namespace pallax {
 namespace {
 
-class EndToEndSimulation : public EndToEnd {
-protected:
-    static std::string contentOf(const std::string& path) {
-        std::ifstream file(path, std::ios::binary);
-        return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-    }
-};
+using doubles::contentOf;
+
+class EndToEndSimulation : public EndToEnd {};
 
 TEST_F(EndToEndSimulation, ADemoOfEachTechnologyPrintsTheTicksOfItsMinuteAndEnds) {
     for (const RecordedTechnology* technology : simulatedTechnologies()) {

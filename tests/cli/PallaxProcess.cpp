@@ -7,8 +7,6 @@
 #include <csignal>
 #include <cstdlib>
 #include <fcntl.h>
-#include <fstream>
-#include <iterator>
 #include <spawn.h>
 #include <sys/prctl.h>
 #include <sys/wait.h>
@@ -43,27 +41,16 @@ bool within(std::chrono::nanoseconds patience, const std::function<bool()>& cond
     return true;
 }
 
-std::string contentOf(const std::string& path) {
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-}
-
 } // namespace
 
 World::World() {
     (void)::prctl(PR_SET_CHILD_SUBREAPER, 1);
-    std::string name = testing::TempDir() + "pallax-XXXXXX";
-    _folder = ::mkdtemp(name.data());
-}
-
-World::~World() {
-    std::filesystem::remove_all(_folder);
 }
 
 std::vector<std::string> World::sockets() const {
     std::vector<std::string> names;
     std::error_code missing;
-    for (const auto& entry : std::filesystem::directory_iterator(_folder / "pallax", missing)) {
+    for (const auto& entry : std::filesystem::directory_iterator(path("pallax"), missing)) {
         if (entry.is_socket()) {
             names.push_back(entry.path().filename().string());
         }
@@ -88,7 +75,7 @@ std::string programPath() {
 
 std::vector<std::string> programEnvironment(const World& world) {
     std::vector<std::string> environment = world.environment; // of two, the first is seen
-    environment.insert(environment.end(), {"XDG_RUNTIME_DIR=" + world.folder().string(),
+    environment.insert(environment.end(), {"XDG_RUNTIME_DIR=" + world.path(),
                                            "XDG_CONFIG_HOME=" + world.path("config"), "TZ=UTC"});
     return environment;
 }

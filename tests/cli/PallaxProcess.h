@@ -1,7 +1,8 @@
 #pragma once
 
+#include "tests/doubles/Files.h"
+
 #include <chrono>
-#include <filesystem>
 #include <functional>
 #include <string>
 #include <sys/types.h>
@@ -15,12 +16,9 @@ namespace pallax::doubles {
 class World {
 public:
     World();
-    ~World();
-    World(const World&) = delete;
-    World& operator=(const World&) = delete;
 
-    const std::filesystem::path& folder() const { return _folder; }
-    std::string path(const std::string& name) const { return (_folder / name).string(); }
+    std::string path() const { return _folder.path(); }
+    std::string path(const std::string& name) const { return _folder.path(name); }
     /// The sockets there are now, sorted.
     std::vector<std::string> sockets() const;
 
@@ -28,7 +26,7 @@ public:
     std::vector<std::string> environment;
 
 private:
-    std::filesystem::path _folder;
+    TemporaryFolder _folder;
 };
 
 /// The program under test: `pallax` as it was built, or what the environment's PALLAX_TEST_PROGRAM

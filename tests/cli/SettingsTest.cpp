@@ -1,5 +1,7 @@
 #include "cli/Settings.h"
 
+#include "tests/doubles/Files.h"
+
 #include <gtest/gtest.h>
 
 #include <cstdlib>
@@ -47,33 +49,22 @@ TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
 
 class SettingsFileTest : public testing::Test {
 protected:
-    SettingsFileTest() {
-        std::string name = testing::TempDir() + "pallax-settings-XXXXXX";
-        folder = ::mkdtemp(name.data());
-    }
-    ~SettingsFileTest() override { std::filesystem::remove_all(folder); }
-
-    std::string write(const std::string& name, const std::string& text) const {
-        std::ofstream(folder / name) << text;
-        return (folder / name).string();
-    }
-
-    std::filesystem::path folder;
+    doubles::TemporaryFolder folder;
 };
 
 TEST_F(SettingsFileTest, TheFirstFileThatExistsHoldsAlone) {
-    const std::string first = write("first", "snapshot-directory = /a\n");
-    const std::string second = write("second", "on-fatal-record = skip\n");
-    const auto settings = loadSettings({(folder / "missing").string(), first, second});
+    const std::string first = folder.write("first", "snapshot-directory = /a\n");
+    const std::string second = folder.write("second", "on-fatal-record = skip\n");
+    const auto settings = loadSettings({folder.path("missing"), first, second});
     ASSERT_TRUE(settings);
     EXPECT_EQ(settings->snapshotDirectory, "/a");
     EXPECT_EQ(settings->onFatalRecord, OnFatalRecord::Stop);
 }
 
 TEST_F(SettingsFileTest, AFolderInItsPlaceCannotBeRead) {
-    const auto settings = loadSettings({folder.string()});
+    const auto settings = loadSettings({folder.path()});
     ASSERT_FALSE(settings);
-    EXPECT_EQ(settings.error().sentence, folder.string() + " cannot be read.");
+    EXPECT_EQ(settings.error().sentence, folder.path() + " cannot be read.");
 }
 
 TEST(SettingsFiles, AreTheUsersThenTheSystems) {

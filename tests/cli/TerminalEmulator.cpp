@@ -168,81 +168,97 @@ void TerminalEmulator::sequence(char final) {
     const int count = number(0, 1);
     const bool keepsWrap = final == 'm' || final == 'b';
     _wrapsNext = _wrapsNext && keepsWrap;
-    Row& line = row();
-    const auto at = line.begin() + _x;
-    const auto room = _columns - _x;
+    constexpr std::string_view kWithoutEffect = "mtlh"; // colours and modes that no text shows
+    if (final == 'b') {
+        for (int repeated = 0; repeated < count; ++repeated) {
+            print(_last);
+        }
+    } else if (!moveCursor(final, count) && !editRow(final, count) && !editScreen(final, count) &&
+               kWithoutEffect.find(final) == std::string_view::npos) {
+        _unknown += final;
+    }
+    clampCursor();
+}
+
+bool TerminalEmulator::moveCursor(char final, int count) {
     switch (final) {
     case 'H':
     case 'f':
         _y = number(0, 1) - 1;
         _x = number(1, 1) - 1;
-        break;
+        return true;
     case 'A':
         _y -= count;
-        break;
+        return true;
     case 'B':
         _y += count;
-        break;
+        return true;
     case 'C':
         _x += count;
-        break;
+        return true;
     case 'D':
         _x -= count;
-        break;
+        return true;
     case 'G':
         _x = count - 1;
-        break;
+        return true;
     case 'd':
         _y = count - 1;
-        break;
-    case 'J':
-        eraseInDisplay(number(0, 0));
-        break;
+        return true;
+    default:
+        return false;
+    }
+}
+
+bool TerminalEmulator::editRow(char final, int count) {
+    Row& line = row();
+    const auto at = line.begin() + _x;
+    const int changed = std::min(count, _columns - _x);
+    switch (final) {
     case 'K':
         eraseInLine(number(0, 0));
-        break;
+        return true;
     case 'X':
-        std::fill_n(at, std::min(count, room), " ");
-        break;
+        std::fill_n(at, changed, " ");
+        return true;
     case 'P':
-        std::rotate(at, at + std::min(count, room), line.end());
-        std::fill_n(line.rbegin(), std::min(count, room), " ");
-        break;
+        std::rotate(at, at + changed, line.end());
+        std::fill_n(line.rbegin(), changed, " ");
+        return true;
     case '@':
-        std::rotate(at, line.end() - std::min(count, room), line.end());
-        std::fill_n(at, std::min(count, room), " ");
-        break;
+        std::rotate(at, line.end() - changed, line.end());
+        std::fill_n(at, changed, " ");
+        return true;
+    default:
+        return false;
+    }
+}
+
+bool TerminalEmulator::editScreen(char final, int count) {
+    switch (final) {
+    case 'J':
+        eraseInDisplay(number(0, 0));
+        return true;
     case 'L':
         insertLines(count);
-        break;
+        return true;
     case 'M':
         deleteLines(count);
-        break;
+        return true;
     case 'S':
         scrollUp(count);
-        break;
+        return true;
     case 'T':
         scrollDown(count);
-        break;
+        return true;
     case 'r':
         _top = number(0, 1) - 1;
         _bottom = number(1, static_cast<int>(_rows.size())) - 1;
         _x = _y = 0;
-        break;
-    case 'b':
-        for (int repeated = 0; repeated < count; ++repeated) {
-            print(_last);
-        }
-        break;
-    case 'm':
-    case 't':
-    case 'l':
-    case 'h':
-        break;
+        return true;
     default:
-        _unknown += final;
+        return false;
     }
-    clampCursor();
 }
 
 void TerminalEmulator::privateMode(bool isSet) {

@@ -27,6 +27,10 @@ private:
     void control(char byte);
     void escape(char byte);
     void sequence(char final);
+    // Each does what the final byte of a control sequence says; false when that is not its own.
+    bool moveCursor(char final, int count);
+    bool editRow(char final, int count);
+    bool editScreen(char final, int count);
     void privateMode(bool isSet);
     void print(const std::string& character);
     void eraseInDisplay(int what);

@@ -1,5 +1,6 @@
 #include "tests/docs/ConsoleBlocks.h"
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Files.h"
+#include "tests/doubles/Shell.h"
 
 #include <gtest/gtest.h>
 

@@ -1,8 +1,8 @@
+#include "tests/doubles/Files.h"
+
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <regex>
 #include <set>
 #include <string>
@@ -11,12 +11,7 @@ namespace pallax {
 namespace {
 
 namespace fs = std::filesystem;
-
-std::string contentOf(const fs::path& path) {
-    std::ifstream file(path, std::ios::binary);
-    EXPECT_TRUE(file.is_open()) << path;
-    return {std::istreambuf_iterator<char>(file), {}};
-}
+using doubles::contentOf;
 
 /// Everything that `pattern` (with `parts` groups, joined by dots) finds in a text.
 std::set<std::string> found(const std::string& text, const std::regex& pattern, int parts) {

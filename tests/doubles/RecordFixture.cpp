@@ -1,6 +1,7 @@
 #include "tests/doubles/RecordFixture.h"
 
 #include "LogGenerator/LogPacket.h"
+#include "tests/doubles/InOrder.h"
 
 #include <gtest/gtest.h>
 

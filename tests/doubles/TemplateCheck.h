@@ -2,11 +2,10 @@
 
 #include "LogGenerator/Records/ClassIndex.h"
 #include "platform/PropertyListCodec.h"
+#include "tests/doubles/Files.h"
 
 #include <gtest/gtest.h>
 
-#include <fstream>
-#include <iterator>
 #include <map>
 #include <string>
 
@@ -14,9 +13,8 @@ namespace pallax::doubles {
 
 /// The property list in a file of the source tree; null, with a failed expectation, without one.
 inline PropertyList propertyListFile(const std::string& path) {
-    std::ifstream file(path, std::ios::binary);
-    const ByteBuffer bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-    const PropertyListResult parsed = parsePropertyList(bytes);
+    const std::string content = contentOf(path);
+    const PropertyListResult parsed = parsePropertyList(ByteBuffer(content.begin(), content.end()));
     EXPECT_TRUE(parsed) << path;
     return parsed ? *parsed : PropertyList();
 }

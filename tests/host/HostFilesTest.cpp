@@ -125,8 +125,17 @@ TEST_F(HostFilesTest, TheResourceFolderMayBeChosen) {
     (void)::setenv("PALLAX_RESOURCES", "/some/folder", 1);
     EXPECT_EQ(DirectoryResources::programFolder(), "/some/folder");
     (void)::unsetenv("PALLAX_RESOURCES");
-    // This test runs from its build folder.
-    EXPECT_EQ(DirectoryResources::programFolder(), PALLAX_SOURCE_DIR "/resources");
+    EXPECT_TRUE(DirectoryResources::programFolder().ends_with("/share/pallax"));
+}
+
+TEST_F(HostFilesTest, TheResourceFolderIsFoundFromTheProgram) {
+    const std::string program = _folder.file("prefix/bin/pallax");
+    std::filesystem::create_directories(_folder.file("prefix/bin"));
+    EXPECT_EQ(DirectoryResources::folderFor(program), _folder.file("prefix/share/pallax"));
+    std::filesystem::create_directories(_folder.file("prefix/share/pallax"));
+    EXPECT_EQ(DirectoryResources::folderFor(program), _folder.file("prefix/share/pallax"));
+    std::filesystem::create_directories(_folder.file("prefix/bin/share/pallax"));
+    EXPECT_EQ(DirectoryResources::folderFor(program), _folder.file("prefix/bin/share/pallax"));
 }
 
 TEST_F(HostFilesTest, AFileAboveTheLimitIsNotRead) {

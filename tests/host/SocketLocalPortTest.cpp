@@ -1,6 +1,6 @@
 #include "host/PortFrame.h"
 #include "host/SourceTimeListener.h"
-#include "tests/host/PortPair.h"
+#include "tests/doubles/PortPair.h"
 
 #include <algorithm>
 #include <stdexcept>
@@ -13,6 +13,9 @@
 namespace pallax {
 namespace {
 
+using doubles::openDirectory;
+using doubles::PortTest;
+using doubles::runUntil;
 using namespace std::chrono_literals;
 
 class SocketLocalPortTest : public PortTest {

@@ -1,5 +1,5 @@
 #include "host/PortFrame.h"
-#include "tests/host/PortPair.h"
+#include "tests/doubles/PortPair.h"
 
 #include <atomic>
 #include <optional>
@@ -8,6 +8,10 @@
 namespace pallax {
 namespace {
 
+using doubles::openDirectory;
+using doubles::OtherProcess;
+using doubles::PortTest;
+using doubles::runUntil;
 using namespace std::chrono_literals;
 
 /// The local port runs on a queue of its own, as in another process.

@@ -1,4 +1,4 @@
-#include "tests/monitor/ModelFixture.h"
+#include "tests/doubles/ModelFixture.h"
 
 namespace pallax {
 namespace {
@@ -16,10 +16,6 @@ protected:
         EXPECT_EQ(ports.local(), nullptr);
         EXPECT_EQ(ports.remote(), nullptr);
         EXPECT_TRUE(retriesAfter5Seconds());
-    }
-    void expectQueryFailure(const std::string& text) {
-        start();
-        EXPECT_EQ(log.lines(), (Lines{{3, text}, {3, kNoGenerator}}));
     }
 };
 

@@ -1,4 +1,4 @@
-#include "tests/monitor/ModelFixture.h"
+#include "tests/doubles/ModelFixture.h"
 
 namespace pallax {
 namespace {

@@ -1,7 +1,8 @@
 #include "cli/Completion.h"
 
 #include "cli/CommandLine.h"
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Files.h"
+#include "tests/doubles/Shell.h"
 
 #include <gtest/gtest.h>
 

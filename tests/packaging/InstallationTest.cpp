@@ -1,11 +1,13 @@
 #include "cli/CommandLine.h"
 #include "cli/Completion.h"
 #include "cli/ManualPage.h"
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Files.h"
+#include "tests/doubles/Shell.h"
 
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <regex>
 #include <set>
 
 namespace pallax {
@@ -74,6 +76,23 @@ TEST_F(Installation, EveryManualPageAndCompletionIsThere) {
               completionScript(program, "zsh"));
     EXPECT_EQ(contentOf(prefix.path("share/fish/vendor_completions.d/pallax.fish")),
               completionScript(program, "fish"));
+}
+
+TEST_F(Installation, WhatTheDocumentsLeadToIsThere) {
+    const std::regex link("\\]\\(([^)#:]+)\\)");
+    std::size_t links = 0;
+    for (const std::string& name : files("share/doc/pallax")) {
+        if (!name.ends_with(".md")) {
+            continue;
+        }
+        const std::string text = contentOf(prefix.path("share/doc/pallax/" + name));
+        const fs::path folder = fs::path(prefix.path("share/doc/pallax/" + name)).parent_path();
+        for (std::sregex_iterator match(text.begin(), text.end(), link), end; match != end;
+             ++match, ++links) {
+            EXPECT_TRUE(fs::exists(folder / match->str(1))) << name << ": " << match->str(1);
+        }
+    }
+    EXPECT_GE(links, 10U) << "the README, the tour and the tables of the records lead to others";
 }
 
 TEST_F(Installation, TheServiceUnitStartsTheInstalledProgram) {

@@ -2,7 +2,8 @@
 
 #include "cli/CommandLine.h"
 #include "cli/HelpText.h"
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Files.h"
+#include "tests/doubles/Shell.h"
 
 #include <gtest/gtest.h>
 

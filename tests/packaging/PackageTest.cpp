@@ -1,9 +1,9 @@
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Files.h"
+#include "tests/doubles/Shell.h"
 
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <memory>
 #include <set>
 #include <unistd.h>
 
@@ -16,27 +16,17 @@ using doubles::isInstalled;
 using doubles::runCommand;
 using doubles::TemporaryFolder;
 
-/// The Debian package, made anew for each process of these tests.
+/// The Debian package, which the test MakePackage has made.
 class Package : public testing::Test {
 protected:
-    static void SetUpTestSuite() {
-        made = std::make_unique<TemporaryFolder>();
-        if (isInstalled("dpkg-deb") && isInstalled("dpkg-shlibdeps")) {
-            const auto run =
-                runCommand(PALLAX_CPACK " --config " PALLAX_BINARY_DIR "/CPackConfig.cmake -B " +
-                           made->path());
-            EXPECT_EQ(run.status, 0) << run.out;
-        }
-    }
-    static void TearDownTestSuite() { made.reset(); }
-
     void SetUp() override {
         if (!isInstalled("dpkg-deb") || !isInstalled("dpkg-shlibdeps")) {
             GTEST_SKIP() << "dpkg-dev is not installed";
         }
+        ASSERT_TRUE(fs::is_directory(PALLAX_PACKAGE_FOLDER)) << "ctest -R MakePackage makes it";
     }
 
-    static std::string package() { return made->path("pallax_*.deb"); }
+    static std::string package() { return PALLAX_PACKAGE_FOLDER "/pallax_*.deb"; }
 
     /// Everything in a folder but the package manager's own files, from there on.
     static std::set<std::string> content(const std::string& root) {
@@ -53,11 +43,8 @@ protected:
         return names;
     }
 
-    static std::unique_ptr<TemporaryFolder> made;
     TemporaryFolder folder;
 };
-
-std::unique_ptr<TemporaryFolder> Package::made;
 
 TEST_F(Package, RunsFromWhereItIsUnpacked) {
     const std::string depends = runCommand("dpkg-deb -f " + package() + " Depends").out;
@@ -73,6 +60,12 @@ TEST_F(Package, RunsFromWhereItIsUnpacked) {
                                  " demo --print --seconds 4 --speed max");
     EXPECT_EQ(demo.status, 0);
     EXPECT_NE(demo.out.find("\nServing Cell Info\n"), std::string::npos) << demo.out;
+}
+
+TEST_F(Package, DoesNotKnowWhereItWasBuilt) {
+    ASSERT_EQ(runCommand("dpkg-deb -x " + package() + " " + folder.path("root")).status, 0);
+    EXPECT_EQ(contentOf(folder.path("root/usr/bin/pallax")).find(PALLAX_SOURCE_DIR "/resources"),
+              std::string::npos);
 }
 
 TEST_F(Package, HasCompressedManualPagesAndAChangelog) {

@@ -1,3 +1,4 @@
+#include "tests/doubles/InOrder.h"
 #include "tests/platform/PropertyListSupport.h"
 
 #include <gtest/gtest.h>
@@ -7,6 +8,8 @@
 
 namespace pallax {
 namespace {
+
+using doubles::sameInOrder;
 
 PropertyListResult parse(const std::vector<ByteBuffer>& objects) {
     return parseBinaryPropertyList(BinaryFile(objects).bytes());

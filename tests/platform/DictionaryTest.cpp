@@ -1,6 +1,7 @@
 // What a dictionary keeps to be quick must never show.
 
 #include "platform/PropertyList.h"
+#include "tests/doubles/InOrder.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck.h>
@@ -11,6 +12,8 @@
 
 namespace pallax {
 namespace {
+
+using doubles::sameInOrder;
 
 /// What a dictionary does, done in the simplest way.
 class Model {

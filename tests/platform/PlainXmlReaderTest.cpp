@@ -1,6 +1,7 @@
 #include "platform/PlainXmlReader.h"
 
 #include "platform/PropertyListCodec.h"
+#include "tests/doubles/InOrder.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck.h>
@@ -10,6 +11,8 @@
 
 namespace pallax {
 namespace {
+
+using doubles::sameInOrder;
 
 constexpr const char* kHead =
     "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n<plist version=\"1.0\">\n";

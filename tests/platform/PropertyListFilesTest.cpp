@@ -1,6 +1,7 @@
 // Files of another codec against their content, which lies beside them as tagged JSON.
 
 #include "platform/Base64.h"
+#include "tests/doubles/Files.h"
 #include "tests/platform/PropertyListSupport.h"
 
 #include <gtest/gtest.h>
@@ -8,9 +9,12 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <fstream>
 
 namespace pallax {
 namespace {
+
+using doubles::contentOf;
 
 PropertyList fromTagged(const nlohmann::ordered_json& tagged);
 
@@ -83,7 +87,7 @@ protected:
 TEST_P(PropertyListFiles, HoldsItsContent) {
     std::ifstream json(path(".json"));
     const PropertyList expected = fromTagged(nlohmann::ordered_json::parse(json));
-    const PropertyList list = valueOf(parsePropertyList(contentOf(path(".bplist"))));
+    const PropertyList list = valueOf(parsePropertyList(bytesOf(contentOf(path(".bplist")))));
     ASSERT_EQ(list, expected);
     EXPECT_TRUE(sameOrderAtEveryDepth(list, expected));
     EXPECT_EQ(valueOf(parsePropertyList(*serializeBinary(list))), list);
@@ -91,7 +95,7 @@ TEST_P(PropertyListFiles, HoldsItsContent) {
 }
 
 TEST_P(PropertyListFiles, ATruncatedCopyIsRefused) {
-    const ByteBuffer bytes = contentOf(path(".bplist"));
+    const ByteBuffer bytes = bytesOf(contentOf(path(".bplist")));
     constexpr std::size_t kMostCuts = 1000;
     const std::size_t step = std::max<std::size_t>(1, bytes.size() / kMostCuts);
     for (std::size_t length = 0; length < bytes.size(); length += step) {

@@ -4,8 +4,6 @@
 
 #include <gtest/gtest.h>
 
-#include <fstream>
-#include <iterator>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -15,11 +13,6 @@ namespace pallax {
 
 inline ByteBuffer bytesOf(std::string_view text) {
     return {text.begin(), text.end()};
-}
-
-inline ByteBuffer contentOf(const std::string& path) {
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
 }
 
 /// "at byte 3: …", or "" when the result is none.

@@ -1,9 +1,13 @@
 #include "platform/PropertyList.h"
 
+#include "tests/doubles/InOrder.h"
+
 #include <gtest/gtest.h>
 
 namespace pallax {
 namespace {
+
+using doubles::sameInOrder;
 
 constexpr NumberFormat kShownDbm{"%d dBm"};
 

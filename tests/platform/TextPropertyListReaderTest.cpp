@@ -1,9 +1,12 @@
+#include "tests/doubles/InOrder.h"
 #include "tests/platform/PropertyListSupport.h"
 
 #include <gtest/gtest.h>
 
 namespace pallax {
 namespace {
+
+using doubles::sameInOrder;
 
 PropertyListResult parseText(std::string_view text) {
     return parseTextPropertyList(bytesOf(text));

@@ -1,3 +1,4 @@
+#include "tests/doubles/InOrder.h"
 #include "tests/platform/PropertyListSupport.h"
 
 #include <gtest/gtest.h>
@@ -6,6 +7,8 @@
 
 namespace pallax {
 namespace {
+
+using doubles::sameInOrder;
 
 PropertyListResult parse(std::string_view xml) {
     return parseXmlPropertyList(bytesOf(xml));

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "platform/Bytes.h"
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Shell.h"
 #include "tests/reference/AnalyserTree.h"
 
 #include <cstddef>

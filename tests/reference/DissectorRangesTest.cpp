@@ -2,8 +2,8 @@
 #include "platform/TelephonyConstants.h"
 #include "telephony/simulator/common/PropertyListRecord.h"
 #include "tests/doubles/RecordBuilder.h"
+#include "tests/doubles/Shell.h"
 #include "tests/doubles/TextPropertyList.h"
-#include "tests/packaging/Shell.h"
 #include "tests/reference/DisplayComparison.h"
 #include "tests/reference/ReferenceFixture.h"
 

@@ -1,5 +1,5 @@
 #include "samples/Samples.h"
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Shell.h"
 #include "tests/reference/DisplayComparison.h"
 
 #include <gmock/gmock.h>

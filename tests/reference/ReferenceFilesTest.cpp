@@ -1,7 +1,7 @@
 #include "reference/ReferenceFiles.h"
 
 #include "host/DirectoryResources.h"
-#include "tests/packaging/Shell.h"
+#include "tests/doubles/Files.h"
 
 #include <gtest/gtest.h>
 

@@ -1,18 +1,15 @@
 #include "samples/Samples.h"
 
+#include "tests/doubles/Files.h"
+
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <fstream>
-#include <iterator>
 
 namespace pallax {
 namespace {
 
-std::string contentOf(const std::filesystem::path& path) {
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-}
+using doubles::contentOf;
 
 TEST(Samples, TheProgramWritesTheSameBytesAgain) {
     for (const Sample& sample : samples()) {

@@ -2,12 +2,16 @@
 
 #include "host/RecordingWriter.h"
 #include "platform/PropertyList.h"
-#include "tests/host/PortPair.h"
+#include "tests/doubles/PortPair.h"
 
 #include <stdexcept>
 #include <string>
 
 namespace pallax {
+
+using doubles::openDirectory;
+using doubles::OtherProcess;
+using doubles::runUntil;
 
 /// The stamp of the first packet of every recording made here.
 inline constexpr Time kRecordingStart{std::chrono::seconds(1700000000)};

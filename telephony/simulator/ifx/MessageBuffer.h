@@ -51,8 +51,6 @@ public:
         return place;
     }
     Bytes bytes() const { return Bytes(_bytes).first(_size); }
-    /// Forgets all but the first `size` bytes.
-    void cutTo(std::size_t size) { _size = size; }
 
 private:
     std::array<std::uint8_t, kCapacity + kShortPiece> _bytes; // only what has been put is set

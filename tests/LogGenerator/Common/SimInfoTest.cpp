@@ -1,6 +1,7 @@
 #include "LogGenerator/Common/SimInfo.h"
 
 #include "LogGenerator/Common/LogCode_0xFF000020.h"
+#include "tests/doubles/InOrder.h"
 #include "tests/doubles/Property.h"
 #include "tests/doubles/PropertyListRecord.h"
 #include "tests/doubles/RecordFixture.h"

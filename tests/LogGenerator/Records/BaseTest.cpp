@@ -103,6 +103,17 @@ TEST(Base, ListsAreEmptiedAndRefilledUnderTheArrayLock) {
     expectToWaitForTheLock([&record] { record.clearList(); }, list, {});
 }
 
+TEST(Base, AnArrayIsEmptiedOrReplacedUnderTheArrayLock) {
+    const PropertyList list = Array{"old", "older"};
+    Array& array = *list.array();
+    expectToWaitForTheLock(
+        [&array] {
+            Base::replaceArray(array, {"new", "newer"});
+        },
+        list, {"new", "newer"});
+    expectToWaitForTheLock([&array] { Base::clearElementsInArray(array); }, list, {});
+}
+
 TEST(Base, AnUnknownCodeIsLoggedInDecimal) {
     RecordingLog log;
     Example::logUnknown(0x7131);

@@ -1,6 +1,7 @@
 // The entries of a list serve the next one, unless somebody else holds them.
 
 #include "LogGenerator/Records/Base.h"
+#include "tests/doubles/InOrder.h"
 
 #include <gtest/gtest.h>
 
@@ -8,6 +9,8 @@
 
 namespace pallax {
 namespace {
+
+using doubles::sameInOrder;
 
 constexpr auto kFields = std::to_array<Field>({
     {"First", u8At(0), Conversion::number()},

@@ -1,8 +1,9 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "LogGenerator/UTRAN/UTRANLogGenerator.h"
 #include "tests/doubles/GeneratorFixture.h"
+#include "tests/doubles/InOrder.h"
+#include "tests/doubles/ModelFixture.h"
 #include "tests/doubles/RecordFixture.h"
-#include "tests/monitor/ModelFixture.h"
 
 #include <gtest/gtest.h>
 
@@ -13,6 +14,7 @@ using doubles::GeneratorFixture;
 using doubles::ModelFixture;
 using doubles::Record;
 using doubles::RecordingLog;
+using doubles::sameInOrder;
 using Lines = std::vector<RecordingLog::Line>;
 
 /// A generator that found no template, with a log that begins behind its making.

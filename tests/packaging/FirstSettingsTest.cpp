@@ -1,6 +1,5 @@
 #include "cli/Settings.h"
-#include "tests/cli/PallaxProcess.h"
-#include "tests/doubles/RuntimeFolder.h"
+#include "tests/doubles/Files.h"
 
 #include <gtest/gtest.h>
 
@@ -20,14 +19,14 @@ protected:
     int run(const std::string& environment) const {
         const std::string command = "env -i PATH=/usr/bin:/bin " + environment + " " +
                                     PALLAX_SOURCE_DIR + "/scripts/first-settings 2>" +
-                                    world.path("err");
+                                    folder.path("err");
         return std::system(command.c_str()); // NOLINT(cert-env33-c): the script is ours
     }
-    std::string home() const { return "HOME=" + world.folder().string(); }
+    std::string home() const { return "HOME=" + folder.path(); }
 
-    doubles::World world;
-    std::string file = world.path(".config/pallax/pallax.conf");
-    std::string snapshots = world.path(".local/state/pallax/snapshots");
+    doubles::TemporaryFolder folder;
+    std::string file = folder.path(".config/pallax/pallax.conf");
+    std::string snapshots = folder.path(".local/state/pallax/snapshots");
 };
 
 TEST_F(FirstSettings, AreWrittenOnceAndTheSnapshotFolderIsMade) {
@@ -38,15 +37,15 @@ TEST_F(FirstSettings, AreWrittenOnceAndTheSnapshotFolderIsMade) {
     EXPECT_EQ(settings->snapshotDirectory, snapshots);
     EXPECT_EQ(settings->saveButtonMarker, snapshots);
     EXPECT_EQ(settings->onFatalRecord, OnFatalRecord::Stop);
-    EXPECT_EQ(contentOf(world.path("err")),
+    EXPECT_EQ(contentOf(folder.path("err")),
               "Settings were written to " + file + "; snapshots go to " + snapshots + ".\n");
 
     EXPECT_EQ(run(home()), 0);
-    EXPECT_EQ(contentOf(world.path("err")), "");
+    EXPECT_EQ(contentOf(folder.path("err")), "");
 }
 
 TEST_F(FirstSettings, ThatTheUserHasAreKept) {
-    std::filesystem::create_directories(world.path(".config/pallax"));
+    std::filesystem::create_directories(folder.path(".config/pallax"));
     std::ofstream(file) << "on-fatal-record = skip\n";
     EXPECT_EQ(run(home()), 0);
     EXPECT_EQ(contentOf(file), "on-fatal-record = skip\n");
@@ -61,11 +60,11 @@ TEST_F(FirstSettings, AMissingSnapshotFolderIsMadeAgain) {
 }
 
 TEST_F(FirstSettings, FollowTheFoldersOfTheEnvironment) {
-    EXPECT_EQ(
-        run(home() + " XDG_CONFIG_HOME=" + world.path("c") + " XDG_STATE_HOME=" + world.path("s")),
-        0);
-    EXPECT_TRUE(std::filesystem::exists(world.path("c/pallax/pallax.conf")));
-    EXPECT_TRUE(std::filesystem::is_directory(world.path("s/pallax/snapshots")));
+    EXPECT_EQ(run(home() + " XDG_CONFIG_HOME=" + folder.path("c") +
+                  " XDG_STATE_HOME=" + folder.path("s")),
+              0);
+    EXPECT_TRUE(std::filesystem::exists(folder.path("c/pallax/pallax.conf")));
+    EXPECT_TRUE(std::filesystem::is_directory(folder.path("s/pallax/snapshots")));
     EXPECT_FALSE(std::filesystem::exists(file));
 }
 

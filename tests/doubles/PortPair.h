@@ -13,7 +13,7 @@
 #include <string>
 #include <thread>
 
-namespace pallax {
+namespace pallax::doubles {
 
 /// Runs the queue's blocks until the condition holds; false after ten seconds.
 inline bool runUntil(AsioMainQueue& queue, const std::function<bool()>& condition) {
@@ -64,9 +64,9 @@ protected:
         return *_ports.directory().socketPath(name);
     }
 
-    doubles::RuntimeFolder _folder;
+    RuntimeFolder _folder;
     AsioMainQueue _queue;
     SocketMessagePorts _ports{_queue, openDirectory()};
 };
 
-} // namespace pallax
+} // namespace pallax::doubles

@@ -1,4 +1,4 @@
-#include "telephony/simulator/SimulatedSource.h"
+#include "telephony/SimulatedSource.h"
 
 #include "host/Recording.h"
 
