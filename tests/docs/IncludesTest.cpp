@@ -1,0 +1,139 @@
+#include "tests/docs/SourceTree.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <map>
+#include <set>
+#include <sstream>
+#include <string>
+#include <string_view>
+#include <vector>
+
+// Which folder may include from which. A header without a source would pass every linker, so the
+// arrows of docs/architecture.md are held here.
+
+namespace pallax {
+namespace {
+
+using doubles::sourceFiles;
+using doubles::sourceText;
+
+struct Layer {
+    std::string folder;
+    std::vector<std::string> mayInclude; ///< beside itself
+};
+
+/// From the bottom up: a folder may include from earlier ones only.
+const std::vector<Layer>& layers() {
+    static const std::string records = "LogGenerator/Records";
+    static const std::string generators = "LogGenerator";
+    static const std::string common = "LogGenerator/Common";
+    static const std::vector<Layer> all{
+        {"platform", {}},
+        {"platform/ui", {"platform"}},
+        {records, {"platform"}},
+        {generators, {"platform", records}},
+        {common, {"platform", records}},
+        {"LogGenerator/C2K", {"platform", records, generators}},
+        {"LogGenerator/GSM", {"platform", generators}},
+        {"LogGenerator/LTE", {"platform", records, generators, common}},
+        {"LogGenerator/UTRAN", {"platform", records, generators, common}},
+        {"LogGenerator/ZOR_GSM", {"platform", records, generators, common}},
+        {"LogGenerator/Technologies",
+         {"platform", generators, "LogGenerator/C2K", "LogGenerator/GSM", "LogGenerator/LTE",
+          "LogGenerator/UTRAN", "LogGenerator/ZOR_GSM"}},
+        {"app/tree", {"platform", records}},
+        {"monitor", {"platform", generators, "app/tree"}},
+        {"app", {"platform", "platform/ui", "app/tree", "monitor"}},
+        {"host", {"platform"}},
+        {"ui/terminal", {"platform", "platform/ui"}},
+        {"telephony/simulator", {"platform", "host"}},
+        {"telephony", {"platform", records, generators, "host", "telephony/simulator"}},
+        {"reference",
+         {"platform", records, generators, common, "LogGenerator/C2K", "LogGenerator/GSM",
+          "LogGenerator/LTE", "LogGenerator/UTRAN", "LogGenerator/ZOR_GSM",
+          "LogGenerator/Technologies", "host"}},
+        {"cli",
+         {"platform", records, generators, "LogGenerator/Technologies", "app/tree", "monitor",
+          "app", "host", "ui/terminal", "telephony/simulator", "telephony"}},
+        {"tests/doubles", {"platform", "platform/ui", records, generators, "monitor", "host"}},
+        {"samples", {"platform", "host", "telephony/simulator", "tests/doubles"}},
+    };
+    return all;
+}
+
+/// Those above everything, which include what they look at, and of the tests what is shared.
+const std::set<std::string> kAbove{"bench", "fuzz"};
+const std::string kStage = "tests/ui/terminal/StageScript.h"; ///< shared with a fuzz target
+
+/// The row that a file belongs to: that of the longest folder; else the first folder of its path.
+std::string layerOf(const std::string& path) {
+    std::string found;
+    for (const Layer& layer : layers()) {
+        if (path.starts_with(layer.folder + "/") && layer.folder.size() > found.size()) {
+            found = layer.folder;
+        }
+    }
+    return found.empty() ? path.substr(0, path.find('/')) : found;
+}
+
+/// What the file includes of this source tree.
+std::vector<std::string> includesOf(const std::string& path) {
+    constexpr std::string_view kDirective = "#include \"";
+    std::istringstream text(sourceText(path));
+    std::vector<std::string> names;
+    for (std::string line; std::getline(text, line);) {
+        if (line.starts_with(kDirective)) {
+            const std::size_t end = line.find('"', kDirective.size());
+            names.push_back(line.substr(kDirective.size(), end - kDirective.size()));
+        }
+    }
+    return names;
+}
+
+TEST(Includes, RunWithTheArrows) {
+    std::map<std::string, std::set<std::string>> allowed;
+    for (const Layer& layer : layers()) {
+        allowed[layer.folder] = {layer.mayInclude.begin(), layer.mayInclude.end()};
+        allowed[layer.folder].insert(layer.folder);
+    }
+    std::size_t looked = 0;
+    for (const std::string& file : sourceFiles({".h", ".cpp"})) {
+        const std::string from = layerOf(file);
+        for (const std::string& name : includesOf(file)) {
+            ++looked;
+            const std::string to = layerOf(name);
+            if (kAbove.contains(from)) {
+                EXPECT_TRUE((to != "tests" || name == kStage) && to != "reference")
+                    << file << " includes " << name;
+            } else if (from != "tests") {
+                EXPECT_TRUE(allowed[from].contains(to)) << file << " includes " << name;
+            }
+        }
+    }
+    EXPECT_GT(looked, 1000U);
+}
+
+TEST(Includes, ArrowsRunOneWay) {
+    std::set<std::string> below;
+    for (const Layer& layer : layers()) {
+        for (const std::string& folder : layer.mayInclude) {
+            EXPECT_TRUE(below.contains(folder)) << layer.folder << " includes from " << folder;
+        }
+        below.insert(layer.folder);
+    }
+}
+
+TEST(Includes, NameFilesFromTheRoot) {
+    const std::vector<std::string> files = sourceFiles({".h", ".cpp"});
+    for (const std::string& file : files) {
+        for (const std::string& name : includesOf(file)) {
+            EXPECT_TRUE(std::binary_search(files.begin(), files.end(), name))
+                << file << " includes " << name;
+        }
+    }
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,86 @@
+#include "tests/docs/SourceTree.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <regex>
+#include <set>
+#include <string>
+#include <vector>
+
+// The files and folders that documents name, and those that they lead to, exist.
+
+namespace pallax {
+namespace {
+
+namespace fs = std::filesystem;
+using doubles::folderOf;
+using doubles::sourceFiles;
+using doubles::sourceText;
+
+/// What stands for something else in a path: what a reader adds, or any name.
+bool isInvented(const std::string& path) {
+    return path.find("Example") != std::string::npos || path.find("NAME") != std::string::npos;
+}
+
+/// Everything that the pattern's group finds outside of fenced blocks.
+std::set<std::string> found(const std::string& document, const std::regex& pattern) {
+    static const std::regex fenced("```[^`]*```");
+    const std::string text = std::regex_replace(document, fenced, "");
+    std::set<std::string> texts;
+    for (std::sregex_iterator match(text.begin(), text.end(), pattern), end; match != end;
+         ++match) {
+        texts.insert((*match)[1]);
+    }
+    return texts;
+}
+
+bool exists(const std::string& folder, const std::string& path) {
+    const fs::path whole = fs::path(PALLAX_SOURCE_DIR) / folder / path;
+    return fs::exists(whole) || fs::exists(whole.string() + ".h"); // a class is named without
+}
+
+/// Gives `look` each document with its folder and its text.
+template <class Look>
+void forEachDocument(const Look& look) {
+    const std::vector<std::string> documents = sourceFiles({".md"});
+    EXPECT_GT(documents.size(), 30U);
+    for (const std::string& document : documents) {
+        SCOPED_TRACE(document);
+        look(folderOf(document), sourceText(document));
+    }
+}
+
+TEST(Paths, BetweenBackticksExist) {
+    const std::regex withFolder("`([A-Za-z0-9_.-]+(?:/[A-Za-z0-9_.-]+)*/[A-Za-z0-9_.-]*)`");
+    forEachDocument([&](const std::string& folder, const std::string& text) {
+        for (const std::string& path : found(text, withFolder)) {
+            EXPECT_TRUE(isInvented(path) || exists("", path) || exists(folder, path)) << path;
+        }
+    });
+}
+
+TEST(Paths, ThatAreFileNamesAreOfSomeFile) {
+    const std::regex fileName("`([A-Za-z0-9_-]+\\.(?:h|cpp|plist|lua|md))`");
+    std::set<std::string> names;
+    for (const std::string& path : sourceFiles({".h", ".cpp", ".plist", ".lua", ".md"})) {
+        names.insert(fs::path(path).filename().string());
+    }
+    forEachDocument([&](const std::string& /*folder*/, const std::string& text) {
+        for (const std::string& name : found(text, fileName)) {
+            EXPECT_TRUE(isInvented(name) || names.contains(name)) << name;
+        }
+    });
+}
+
+TEST(Paths, ThatAreLinkedToExist) {
+    const std::regex link("\\]\\(([^)#:]+)\\)");
+    forEachDocument([&](const std::string& folder, const std::string& text) {
+        for (const std::string& path : found(text, link)) {
+            EXPECT_TRUE(exists(folder, path)) << path;
+        }
+    });
+}
+
+} // namespace
+} // namespace pallax
