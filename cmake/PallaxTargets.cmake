@@ -41,6 +41,13 @@ if(PALLAX_COVERAGE)
     target_link_options(pallax_options INTERFACE ${counters})
 endif()
 
+# For what tells the version and its date.
+add_library(pallax_version INTERFACE)
+target_compile_definitions(pallax_version INTERFACE
+    PALLAX_VERSION="${PROJECT_VERSION}"
+    PALLAX_DATE="${PALLAX_DATE}"
+)
+
 function(pallax_instrument_for_fuzzing target)
     if(PALLAX_BUILD_FUZZERS)
         target_compile_options(${target} PRIVATE -fsanitize=fuzzer-no-link)

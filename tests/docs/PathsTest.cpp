@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
 #include <filesystem>
 #include <regex>
 #include <set>
@@ -41,43 +40,47 @@ bool exists(const std::string& folder, const std::string& path) {
     return fs::exists(whole) || fs::exists(whole.string() + ".h"); // a class is named without
 }
 
-class Paths : public testing::TestWithParam<std::string> {
-protected:
-    std::string text = sourceText(GetParam());
-    std::string folder = folderOf(GetParam());
-};
-
-TEST_P(Paths, BetweenBackticksExist) {
-    static const std::regex withFolder("`([A-Za-z0-9_.-]+(?:/[A-Za-z0-9_.-]+)*/[A-Za-z0-9_.-]*)`");
-    for (const std::string& path : found(text, withFolder)) {
-        EXPECT_TRUE(isInvented(path) || exists("", path) || exists(folder, path)) << path;
+/// Gives `look` each document with its folder and its text.
+template <class Look>
+void forEachDocument(const Look& look) {
+    const std::vector<std::string> documents = sourceFiles({".md"});
+    EXPECT_GT(documents.size(), 30U);
+    for (const std::string& document : documents) {
+        SCOPED_TRACE(document);
+        look(folderOf(document), sourceText(document));
     }
 }
 
-TEST_P(Paths, ThatAreFileNamesAreOfSomeFile) {
-    static const std::regex fileName("`([A-Za-z0-9_-]+\\.(?:h|cpp|plist|lua|md))`");
+TEST(Paths, BetweenBackticksExist) {
+    const std::regex withFolder("`([A-Za-z0-9_.-]+(?:/[A-Za-z0-9_.-]+)*/[A-Za-z0-9_.-]*)`");
+    forEachDocument([&](const std::string& folder, const std::string& text) {
+        for (const std::string& path : found(text, withFolder)) {
+            EXPECT_TRUE(isInvented(path) || exists("", path) || exists(folder, path)) << path;
+        }
+    });
+}
+
+TEST(Paths, ThatAreFileNamesAreOfSomeFile) {
+    const std::regex fileName("`([A-Za-z0-9_-]+\\.(?:h|cpp|plist|lua|md))`");
     std::set<std::string> names;
     for (const std::string& path : sourceFiles({".h", ".cpp", ".plist", ".lua", ".md"})) {
         names.insert(fs::path(path).filename().string());
     }
-    for (const std::string& name : found(text, fileName)) {
-        EXPECT_TRUE(isInvented(name) || names.contains(name)) << name;
-    }
+    forEachDocument([&](const std::string& /*folder*/, const std::string& text) {
+        for (const std::string& name : found(text, fileName)) {
+            EXPECT_TRUE(isInvented(name) || names.contains(name)) << name;
+        }
+    });
 }
 
-TEST_P(Paths, ThatAreLinkedToExist) {
-    static const std::regex link("\\]\\(([^)#:]+)\\)");
-    for (const std::string& path : found(text, link)) {
-        EXPECT_TRUE(exists(folder, path)) << path;
-    }
+TEST(Paths, ThatAreLinkedToExist) {
+    const std::regex link("\\]\\(([^)#:]+)\\)");
+    forEachDocument([&](const std::string& folder, const std::string& text) {
+        for (const std::string& path : found(text, link)) {
+            EXPECT_TRUE(exists(folder, path)) << path;
+        }
+    });
 }
-
-INSTANTIATE_TEST_SUITE_P(All, Paths, testing::ValuesIn(sourceFiles({".md"})), [](const auto& path) {
-    std::string name = path.param;
-    std::replace_if(
-        name.begin(), name.end(), [](char each) { return std::isalnum(each) == 0; }, '_');
-    return name;
-});
 
 } // namespace
 } // namespace pallax
