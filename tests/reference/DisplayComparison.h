@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/Bytes.h"
+#include "tests/doubles/Files.h"
 #include "tests/doubles/Shell.h"
 #include "tests/reference/AnalyserTree.h"
 
