@@ -61,7 +61,7 @@ Marks marked(const std::string& recording, const std::string& filter) {
 }
 
 /// From the first byte to the last that a field is read from.
-MarkedBytes bytesOf(const FieldDescription& field) {
+MarkedBytes markedBytesOf(const FieldDescription& field) {
     constexpr std::size_t kPrefix = 2; // of every packet of the samples
     const std::vector<Extent> extents =
         field.position ? std::vector<Extent>{extentOf(*field.position)} : field.read;
@@ -86,7 +86,7 @@ Marks described(const std::string& technology, const std::string& sectionName, L
                                    [&](const auto& each) { return each.logCode == logCode; });
     Marks marks;
     for (const FieldDescription& field : code->fields) {
-        marks.emplace(field.key, bytesOf(field));
+        marks.emplace(field.key, markedBytesOf(field));
     }
     return marks;
 }
