@@ -9,6 +9,7 @@
 
 #include <array>
 #include <clocale>
+#include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <langinfo.h>
@@ -46,6 +47,24 @@ std::string restoringSequence() {
     }
     return sequence + terminalCapability("rmcup") + "\r\n";
 }
+
+/// Ctrl-Z waits while this lives. The library ignores it while it draws, so that it would be lost;
+/// held back, it takes effect behind the drawing.
+class HeldSuspension {
+public:
+    HeldSuspension() {
+        sigset_t suspension;
+        (void)::sigemptyset(&suspension);
+        (void)::sigaddset(&suspension, SIGTSTP);
+        (void)::sigprocmask(SIG_BLOCK, &suspension, &_before);
+    }
+    ~HeldSuspension() { (void)::sigprocmask(SIG_SETMASK, &_before, nullptr); }
+    HeldSuspension(const HeldSuspension&) = delete;
+    HeldSuspension& operator=(const HeldSuspension&) = delete;
+
+private:
+    sigset_t _before{};
+};
 
 bool isUtf8Locale() {
     return std::string_view(::nl_langinfo(CODESET)) == "UTF-8";
@@ -217,7 +236,9 @@ void CursesTerminal::show(const Grid& grid) {
     if (grid.cursor()) {
         ::move(grid.cursor()->y, grid.cursor()->x);
     }
-    ::refresh();
+    ::wnoutrefresh(::stdscr);
+    const HeldSuspension held;
+    ::doupdate();
 }
 
 void CursesTerminal::repaint() {
