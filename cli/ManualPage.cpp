@@ -1,6 +1,7 @@
 #include "cli/ManualPage.h"
 
 #include "cli/HelpText.h"
+#include "platform/Roff.h"
 
 #include <utility>
 
@@ -30,43 +31,8 @@ The user's settings.
 The system's settings, read where there are none of the user's.
 )";
 
-/// The text as roff shows it again: hyphens stay what is typed, nothing is a request.
-std::string escaped(std::string_view text) {
-    std::string result;
-    for (const char character : text) {
-        const bool lineStarts = result.empty() || result.back() == '\n';
-        if (lineStarts && (character == '.' || character == '\'')) {
-            result.append("\\&");
-        }
-        switch (character) {
-        case '\\':
-            result.append("\\e");
-            break;
-        case '-':
-            result.append("\\-");
-            break;
-        case '\'':
-            result.append("\\(aq");
-            break;
-        case '~':
-            result.append("\\(ti");
-            break;
-        case '^':
-            result.append("\\(ha");
-            break;
-        default:
-            result.push_back(character);
-        }
-    }
-    return result;
-}
-
-std::string bold(std::string_view text) {
-    return "\\fB" + escaped(text) + "\\fR";
-}
-
 std::string italic(std::string_view text) {
-    return "\\fI" + escaped(text) + "\\fR";
+    return "\\fI" + roffText(text) + "\\fR";
 }
 
 /// What is in lower case is typed as it stands, what is in upper case is filled in.
@@ -79,7 +45,7 @@ std::string valueOf(std::string_view value) {
         const bool filledIn = word.size() > 1 && word.front() >= 'A' && word.front() <= 'Z';
         result.append(separates                                ? std::string(word)
                       : filledIn || word == "N" || word == "X" ? italic(word)
-                                                               : bold(word));
+                                                               : roffBold(word));
         value.remove_prefix(word.size());
     }
     return result;
@@ -87,13 +53,13 @@ std::string valueOf(std::string_view value) {
 
 /// A description is a sentence without its full stop.
 std::string sentence(const std::string& text) {
-    return escaped(text) + (text.ends_with('.') ? "\n" : ".\n");
+    return roffText(text) + (text.ends_with('.') ? "\n" : ".\n");
 }
 
 std::string synopsis(const CommandDescription& program, const CommandDescription* command) {
-    std::string line = bold("pallax");
+    std::string line = roffBold("pallax");
     if (command != nullptr) {
-        line += " " + bold(command->name);
+        line += " " + roffBold(command->name);
     }
     line += " [" + italic("OPTION") + "]...";
     for (const OptionDescription& argument : (command != nullptr ? *command : program).arguments) {
@@ -102,7 +68,7 @@ std::string synopsis(const CommandDescription& program, const CommandDescription
         line += argument.repeats ? "..." : "";
     }
     if (command == nullptr) {
-        line += "\n.br\n" + bold("pallax") + " " + italic("COMMAND") + " ...";
+        line += "\n.br\n" + roffBold("pallax") + " " + italic("COMMAND") + " ...";
     }
     return ".SH SYNOPSIS\n" + line + "\n";
 }
@@ -113,7 +79,8 @@ std::string listOf(const char* title, const std::vector<OptionDescription>& opti
         const bool argument = !option.names.front().starts_with('-');
         std::string names;
         for (const std::string& name : option.names) {
-            names.append(names.empty() ? "" : ", ").append(argument ? italic(name) : bold(name));
+            names.append(names.empty() ? "" : ", ")
+                .append(argument ? italic(name) : roffBold(name));
         }
         list += ".TP\n" + names + (option.value.empty() ? "" : " " + valueOf(option.value)) + "\n";
         list += sentence(option.description);
@@ -124,7 +91,7 @@ std::string listOf(const char* title, const std::vector<OptionDescription>& opti
 std::string exitStatus(const std::vector<HelpText::Status>& statuses) {
     std::string list = ".SH EXIT STATUS\n";
     for (const HelpText::Status& status : statuses) {
-        list += ".TP\n" + bold(status.number) + "\n" + sentence(status.meaning);
+        list += ".TP\n" + roffBold(status.number) + "\n" + sentence(status.meaning);
     }
     return list;
 }
@@ -132,7 +99,7 @@ std::string exitStatus(const std::vector<HelpText::Status>& statuses) {
 std::string notesOf(const HelpText& text) {
     std::string paragraphs;
     for (const std::string& note : text.notes) {
-        paragraphs += ".PP\n" + escaped(note) + "\n";
+        paragraphs += ".PP\n" + roffText(note) + "\n";
     }
     return paragraphs;
 }
@@ -140,8 +107,8 @@ std::string notesOf(const HelpText& text) {
 std::string commandsOf(const CommandDescription& program) {
     std::string list = ".SH COMMANDS\n";
     for (const CommandDescription& command : program.commands) {
-        list += ".TP\n" + bold("pallax " + command.name) + "\n";
-        list += escaped(command.description) + "; see\n.BR pallax\\-" + command.name + " (1).\n";
+        list += ".TP\n" + roffBold("pallax " + command.name) + "\n";
+        list += roffText(command.description) + "; see\n.BR pallax\\-" + command.name + " (1).\n";
     }
     return list;
 }
@@ -181,9 +148,9 @@ std::string page(const CommandDescription& program, const CommandDescription* co
     const std::string name = command != nullptr ? "pallax-" + command->name : "pallax";
     const HelpText help = takenApart(subject.footer);
     std::string text = ".\\\" Written by \"pallax manual " + name + "\".\n";
-    text += ".TH " + escaped(upperCase(name)) +
+    text += ".TH " + roffText(upperCase(name)) +
             " 1 " PALLAX_DATE " \"pallax " PALLAX_VERSION "\" Pallax\n";
-    text += ".SH NAME\n" + escaped(name) + " \\- " + escaped(titleOf(subject.description)) + "\n";
+    text += ".SH NAME\n" + roffText(name) + " \\- " + roffText(titleOf(subject.description)) + "\n";
     text += synopsis(program, command);
     text += ".SH DESCRIPTION\n" + sentence(subject.description) + notesOf(help);
     text += listOf("ARGUMENTS", subject.arguments);
@@ -191,7 +158,7 @@ std::string page(const CommandDescription& program, const CommandDescription* co
     if (command == nullptr) {
         text += commandsOf(program);
     }
-    text += ".SH EXAMPLES\n.EX\n" + escaped(help.examples) + "\n.EE\n";
+    text += ".SH EXAMPLES\n.EX\n" + roffText(help.examples) + "\n.EE\n";
     text += exitStatus(help.statuses);
     if (command == nullptr) {
         text += kSurroundings;

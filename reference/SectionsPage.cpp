@@ -1,8 +1,7 @@
 #include "reference/SectionsPage.h"
 
 #include "host/Recording.h"
-#include "platform/Format.h"
-#include "platform/Utf8.h"
+#include "platform/Roff.h"
 #include "reference/CodeText.h"
 
 namespace pallax {
@@ -23,47 +22,6 @@ Numbers are unsigned and little\-endian unless it says otherwise; bit 0 is the l
 Bytes beyond the end of a record read as zero, and a list ends at the first entry that is not whole.
 )";
 
-/// The text as roff shows it again: hyphens stay what is typed, nothing is a request.
-std::string escaped(std::string_view text) {
-    std::string result;
-    for (std::size_t at = 0; at < text.size(); ++at) {
-        const char character = text[at];
-        if (const Utf8CodePoint codePoint = utf8At(text, at); codePoint.size > 1) {
-            result += formatText("\\[u%04X]", {static_cast<std::uint32_t>(codePoint.value)});
-            at += codePoint.size - 1;
-            continue;
-        }
-        switch (character) {
-        case '\\':
-            result.append("\\e");
-            break;
-        case '-':
-            result.append("\\-");
-            break;
-        case '"':
-            result.append("\\(dq");
-            break;
-        case '\'':
-            result.append("\\(aq");
-            break;
-        case '^':
-            result.append("\\(ha");
-            break;
-        case '~':
-            result.append("\\(ti");
-            break;
-        default:
-            result.push_back(character);
-        }
-    }
-    // Roff takes a line that begins so for a request.
-    return result.starts_with('.') ? "\\&" + result : result;
-}
-
-std::string bold(std::string_view text) {
-    return "\\fB" + escaped(text) + "\\fR";
-}
-
 /// ", 9 bits from bit 1" of "9 from bit 1"
 std::string bitsIn(const std::string& bits) {
     if (bits.empty()) {
@@ -76,21 +34,21 @@ std::string bitsIn(const std::string& bits) {
 }
 
 std::string itemOf(const ReferenceRow& row) {
-    std::string text = ".TP\n" + bold(row.key.empty() ? "value" : row.key) + "\n";
+    std::string text = ".TP\n" + roffBold(row.key.empty() ? "value" : row.key) + "\n";
     if (!row.place.empty()) {
         const bool isKey = row.place.front() == 'k';
-        text += escaped((isKey ? "Key " : "Byte ") + row.place) + bitsIn(row.bits) + ": ";
+        text += roffText((isKey ? "Key " : "Byte ") + row.place) + bitsIn(row.bits) + ": ";
     }
-    text += row.shown.empty() ? "" : escaped(row.shown) + ".\n";
-    text += row.unit.empty() ? "" : "Unit: " + escaped(row.unit) + ".\n";
-    return text + escaped(row.meaning) + (row.meaning.empty() ? "" : "\n");
+    text += row.shown.empty() ? "" : roffText(row.shown) + ".\n";
+    text += row.unit.empty() ? "" : "Unit: " + roffText(row.unit) + ".\n";
+    return text + roffText(row.meaning) + (row.meaning.empty() ? "" : "\n");
 }
 
 std::string tableOf(const ReferenceTable& table) {
     std::string text;
     if (!table.heading.empty()) {
-        text += ".PP\n\\fI" + escaped(table.heading) + "\\fR.\n";
-        text += table.sentence.empty() ? "" : escaped(table.sentence) + "\n";
+        text += ".PP\n\\fI" + roffText(table.heading) + "\\fR.\n";
+        text += table.sentence.empty() ? "" : roffText(table.sentence) + "\n";
     }
     for (const ReferenceRow& row : table.rows) {
         text += itemOf(row);
@@ -99,12 +57,12 @@ std::string tableOf(const ReferenceTable& table) {
 }
 
 std::string sectionOf(const TechnologyReference& technology, const SectionReference& section) {
-    std::string text = ".SS " + escaped(std::string(technology.title) + ": " + section.name) +
-                       "\n" + escaped(technology.meaningOf(section.name, "")) +
+    std::string text = ".SS " + roffText(std::string(technology.title) + ": " + section.name) +
+                       "\n" + roffText(technology.meaningOf(section.name, "")) +
                        (section.isList ? "\nA list.\n" : "\n");
     for (const CodeDescription& code : section.codes) {
         const CodeText words = textOf(technology, section, code);
-        text += ".PP\n" + bold(words.title) + ".\n" + escaped(words.demands) + "\n";
+        text += ".PP\n" + roffBold(words.title) + ".\n" + roffText(words.demands) + "\n";
         for (const ReferenceTable& table : words.tables) {
             text += tableOf(table);
         }
@@ -113,9 +71,9 @@ std::string sectionOf(const TechnologyReference& technology, const SectionRefere
 }
 
 std::string headingOf(const TechnologyReference& technology) {
-    return ".SH " + escaped(technology.title) + "\nLink type " +
+    return ".SH " + roffText(technology.title) + "\nLink type " +
            std::to_string(technology.technology->linkType) + ", on the command line " +
-           bold(technology.technology->commandName) + ".\n";
+           roffBold(technology.technology->commandName) + ".\n";
 }
 
 } // namespace
