@@ -32,9 +32,10 @@ struct Technology {
 /// The abstract base of every per-technology generator: turns log packets into a display
 /// dictionary and a save record, always working on the state dictionary that the model owns.
 ///
-/// The state's keys: "Template" (the display template as loaded), "Display" (the live display),
-/// "ExtraInfo", "DisplayState" (data: what was received since the previous display generation; of
-/// an object stream the latest object) and "History" (array of at most 5 entries, oldest first).
+/// The state's keys: "Template" (the display template as loaded), "Display" (the live display, up
+/// to date after `catchUp`), "ExtraInfo", "DisplayState" (data: what was received since the
+/// previous display generation; of an object stream the latest object) and "History" (array of at
+/// most 5 entries, oldest first).
 class LogGenerator {
 public:
     static constexpr std::size_t kHistoryLength = 5;
@@ -51,6 +52,9 @@ public:
     virtual void updateState(Dictionary& state, Bytes data);
     /// The display dictionary, or null when there is none yet. Rotates history and raw capture.
     virtual PropertyList generateLogUsingState(Dictionary& state);
+    /// Brings the live display up to the latest packet, for whoever looks at it, or at the history,
+    /// without generating it: a generator may read a packet as late as that.
+    virtual void catchUp() {}
     /// The property-list dictionary that starts the modem's stream.
     virtual PropertyList getStartCommand() const;
     /// History entries and what else a snapshot file carries: an array.

@@ -33,6 +33,7 @@ ZORLogGenerator2::ZORLogGenerator2(const GeneratorEnvironment& environment, Part
 }
 
 ZORLogGenerator2::~ZORLogGenerator2() {
+    ZORLogGenerator2::catchUp(); // the display outlives its generator
     // The text names one technology whatever the actual one is.
     systemLog(LogPriority::Warning, "ZOR_GSMLogGenerator is destructed %p",
               static_cast<const void*>(this));
@@ -69,7 +70,7 @@ void ZORLogGenerator2::updateWithData(Bytes data) {
         return;
     }
     for (Base* subscriber : *subscribers) {
-        subscriber->updateWithData(record, code);
+        subscriber->receive(record, code);
     }
 }
 
@@ -163,10 +164,17 @@ PropertyList ZORLogGenerator2::generateLogUsingState(Dictionary& state) {
     if (cIndex == nullptr) {
         return {};
     }
+    catchUp();
     PropertyList display = getDisplayFromState(state);
     handOverCapture(state);
     updateHistoryInState(state, environment().clock);
     return display;
+}
+
+void ZORLogGenerator2::catchUp() {
+    if (cIndex != nullptr) {
+        cIndex->catchUp();
+    }
 }
 
 PropertyList ZORLogGenerator2::getStartCommand() const {

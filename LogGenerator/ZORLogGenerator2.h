@@ -23,6 +23,7 @@ public:
 
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
+    void catchUp() override;
     PropertyList getStartCommand() const override;
 
     /// Framing and dispatch of one packet.

@@ -106,10 +106,17 @@ void PallaxApp::showSaveView() {
             .queue = _surroundings.queue,
             .snapshotDirectory = _surroundings.snapshotDirectory,
             .closeSaveView = whileAlive(&PallaxApp::closeSaveView),
+            .catchUp = whileAlive(&PallaxApp::catchUp),
         },
         _model ? _model->getSaveContents() : PropertyList()));
     if (_navController) {
         _navController->presentModal(_saveViewController, true);
+    }
+}
+
+void PallaxApp::catchUp() {
+    if (_model) {
+        _model->catchUp();
     }
 }
 

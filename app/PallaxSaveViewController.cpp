@@ -56,6 +56,7 @@ std::string PallaxSaveViewController::snapshotPath() const {
 }
 
 void PallaxSaveViewController::savePressed() {
+    _surroundings.catchUp();
     const Dictionary root = snapshot(dateText(_timeStamp), _saveHistory, saveDescription().text());
     const std::string path = snapshotPath();
     if (!_surroundings.files.writePropertyList(path, root)) {

@@ -1,5 +1,5 @@
-// Framing alone, and the whole way of one packet through the GSM/UMTS generator: framing, the
-// subscribers of its code, one record or several.
+// Framing alone, and the way of one packet through the GSM/UMTS generator: framing, the subscribers
+// of its code, one record or several, of which most only keep it until somebody looks.
 
 #include "LogGenerator/LogPacket.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMLogGenerator.h"

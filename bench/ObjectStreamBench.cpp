@@ -1,4 +1,5 @@
-// What one picture of the object stream costs: reading the message, and making its display form.
+// What one picture of the object stream costs: reading the message, and making its display form,
+// which the generator does when somebody looks.
 
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "platform/PropertyListCodec.h"

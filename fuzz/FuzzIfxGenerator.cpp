@@ -64,6 +64,9 @@ void feed(LogGenerator& generator, Dictionary& state, Bytes packet) {
         require(Stored(state) == before);
         return;
     }
+    require(state.find("Display")->dictionary() == nullptr ||
+            state.find("Display")->dictionary()->empty()); // to come
+    generator.catchUp();
     requireDisplayForm(*state.find("Display"), true);
     require(state.find("ExtraInfo")->dictionary()->empty());
 }

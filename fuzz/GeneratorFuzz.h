@@ -8,6 +8,7 @@
 #include <algorithm>
 #include <cstddef>
 #include <cstdint>
+#include <cstdlib>
 #include <string>
 
 namespace pallax {
@@ -33,31 +34,40 @@ inline Bytes takePacket(Bytes& input) {
     return packet;
 }
 
-/// A generator under any sequence of packets, up to the display and what a snapshot would save.
-/// The input is packets behind each other, each behind its length (16 bits, little-endian; the
-/// last one may be cut).
-///
-/// The one exception that a record may throw is that of a SIM-file record whose property list
-/// cannot be parsed. Everything else, an index past a record's own count above all, ends the run.
-inline void fuzzGenerator(Bytes input, decltype(Technology::generator) makeGenerator,
-                          const std::string& templateName, PropertyList displayTemplate) {
-    const Listener listener;
-    doubles::GeneratorFixture fixture;
-    fixture.resources.add(templateName, std::move(displayTemplate));
-    const auto generator = makeGenerator(fixture.environment());
+/// The text of the display after the packets, which makes that of every value; a snapshot is made
+/// of it too.
+inline std::string displayAfter(Bytes input, LogGenerator& generator) {
     Dictionary state;
     while (!input.empty()) {
         const Bytes packet = takePacket(input);
         // A copy of its own, so that a sanitizer sees a read past the packet.
         const ByteBuffer message(packet.begin(), packet.end());
         try {
-            generator->updateState(state, message);
-        } catch (const LogCode_0xFF000020::UnknownDataException&) { // NOLINT: allowed, see above
+            generator.updateState(state, message);
+        } catch (const LogCode_0xFF000020::UnknownDataException&) { // NOLINT: allowed, see below
         }
     }
-    const PropertyList display = generator->generateLogUsingState(state);
-    (void)display.description(); // makes the text of every value
-    (void)generator->getSaveContentsFromState(state);
+    const PropertyList display = generator.generateLogUsingState(state);
+    (void)generator.getSaveContentsFromState(state);
+    return display.description();
+}
+
+/// A generator under any sequence of packets, up to the display and what a snapshot would save.
+/// The input is packets behind each other, each behind its length (16 bits, little-endian; the
+/// last one may be cut). Whether somebody reads the log, so that each record is read when it
+/// arrives, or nobody, so that some are kept, the display must be the same.
+///
+/// The one exception that a record may throw is that of a SIM-file record whose property list
+/// cannot be parsed. Everything else, an index past a record's own count above all, ends the run.
+inline void fuzzGenerator(Bytes input, decltype(Technology::generator) makeGenerator,
+                          const std::string& templateName, PropertyList displayTemplate) {
+    doubles::GeneratorFixture fixture;
+    fixture.resources.add(templateName, std::move(displayTemplate));
+    const auto kept = displayAfter(input, *makeGenerator(fixture.environment()));
+    const Listener listener;
+    if (displayAfter(input, *makeGenerator(fixture.environment())) != kept) {
+        std::abort();
+    }
 }
 
 } // namespace pallax

@@ -39,6 +39,16 @@ ByteBuffer fileHeader(int linkType) {
     return header;
 }
 
+/// 0, or errno.
+int put(const ByteBuffer& bytes, std::FILE* file) {
+    const bool isWritten =
+        std::fwrite(bytes.data(), 1, bytes.size(), file) == bytes.size() && std::fflush(file) == 0;
+    if (isWritten) {
+        return 0;
+    }
+    return errno != 0 ? errno : EIO;
+}
+
 } // namespace
 
 Result<std::unique_ptr<RecordingWriter>, HostError>
@@ -57,6 +67,7 @@ RecordingWriter::create(const std::string& path, int linkType, Flush flush) {
 }
 
 RecordingWriter::~RecordingWriter() {
+    (void)finishBlock();
     if (_file != stdout) {
         (void)std::fclose(_file);
     }
@@ -78,19 +89,35 @@ std::optional<HostError> RecordingWriter::write(Time time, Bytes packet) {
     append<4>(_pending, {static_cast<std::uint32_t>(seconds),
                          static_cast<std::uint32_t>((time - second).count()), length, length});
     _pending.insert(_pending.end(), packet.begin(), packet.end());
-    const bool isDue = _flush == Flush::EachPacket || _pending.size() >= kBlockSize;
-    return isDue ? flush() : std::nullopt;
+    if (_flush == Flush::EachPacket) {
+        return flush();
+    }
+    return _pending.size() >= kBlockSize ? beginBlock() : std::nullopt;
 }
 
 std::optional<HostError> RecordingWriter::flush() {
-    const bool isWritten =
-        std::fwrite(_pending.data(), 1, _pending.size(), _file) == _pending.size() &&
-        std::fflush(_file) == 0;
-    _pending.clear();
-    if (!isWritten) {
-        return unwritableRecording(_name, errno);
+    auto error = finishBlock();
+    if (const int number = error ? 0 : put(_pending, _file); number != 0) {
+        error = unwritableRecording(_name, number);
     }
-    return std::nullopt;
+    _pending.clear();
+    return error;
+}
+
+std::optional<HostError> RecordingWriter::beginBlock() {
+    auto error = finishBlock();
+    if (!error) {
+        _block.swap(_pending);
+        _writing = std::async(std::launch::async | std::launch::deferred,
+                              [this] { return put(_block, _file); });
+    }
+    _pending.clear();
+    return error;
+}
+
+std::optional<HostError> RecordingWriter::finishBlock() {
+    const int error = _writing.valid() ? _writing.get() : 0;
+    return error != 0 ? std::optional(unwritableRecording(_name, error)) : std::nullopt;
 }
 
 } // namespace pallax

@@ -261,4 +261,10 @@ PropertyList PallaxModel::getSaveContents() const {
     return _logGenerator ? _logGenerator->getSaveContentsFromState(_state) : PropertyList();
 }
 
+void PallaxModel::catchUp() {
+    if (_logGenerator) {
+        _logGenerator->catchUp();
+    }
+}
+
 } // namespace pallax

@@ -70,8 +70,11 @@ public:
     NodeRef topLevelNodes();
     /// The node that stands at `path` ("/", "/Serving Cell"), or null.
     NodeRef nodeAtPath(std::string_view path);
-    /// The generator's save contents (an array), or null without a generator.
+    /// The generator's save contents (an array), or null without a generator. The sections of their
+    /// displays are the live ones, up to date after `catchUp`.
     PropertyList getSaveContents() const;
+    /// Brings the live display up to the latest packet.
+    void catchUp();
 
 private:
     void retryLater();

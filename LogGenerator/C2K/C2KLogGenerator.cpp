@@ -16,6 +16,7 @@
 
 #include <algorithm>
 #include <array>
+#include <utility>
 
 namespace pallax {
 
@@ -26,19 +27,24 @@ struct Parser {
     LogCode logCode;
     void (*parse)(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
     CodeDescription (*describe)(LogCode logCode);
+    /// Whether a packet replaces all that the one before it under the code has shown, and parsing
+    /// it logs nothing. Null for parsers that keep running values, whose every packet counts.
+    bool (*replacesShown)(const LogRecord& packet) = nullptr;
 };
 
 /// In the order in which the start command names the codes.
 constexpr auto kParsers = std::to_array<Parser>({
-    {0x108A, parseFingerC2I, describeFingerC2I},
-    {0x1183, parseEVDOStatus, describeEVDOStatus},
+    {0x108A, parseFingerC2I, describeFingerC2I, isWholeFingerC2I},
+    {0x1183, parseEVDOStatus, describeEVDOStatus, isWholeEVDOStatus},
     {0x1192, parseForwardDataRate, describeForwardDataRate},
-    {0x12B6, parseEVDOActiveSet, describeEVDOActiveSet},
+    {0x12B6, parseEVDOActiveSet, describeEVDOActiveSet, isWholeEVDOActiveSet},
     {0x119C, parseOneXStatus, describeOneXStatus},
     {0x119D, parseOneXTrafficErrors, describeOneXTrafficErrors},
     {0x127E, parseReverseDataRate, describeReverseDataRate},
-    {0x134F, parseOneXSystemIdentity, describeOneXSystemIdentity},
+    {0x134F, parseOneXSystemIdentity, describeOneXSystemIdentity, isWholeOneXSystemIdentity},
 });
+
+static_assert(kParsers.size() == C2KLogGenerator::kLogCodeCount);
 
 constexpr std::string_view kSorted = "_sorted";
 
@@ -49,6 +55,10 @@ DictionaryRef dictionaryUnder(std::string_view key, const Dictionary& state) {
 }
 
 } // namespace
+
+C2KLogGenerator::~C2KLogGenerator() {
+    C2KLogGenerator::catchUp(); // the display outlives its generator
+}
 
 std::unique_ptr<LogGenerator> C2KLogGenerator::generator(const GeneratorEnvironment& environment) {
     return std::make_unique<C2KLogGenerator>(environment);
@@ -110,12 +120,10 @@ PropertyList C2KLogGenerator::getDisplayFromState(Dictionary& state) const {
 
 void C2KLogGenerator::updateState(Dictionary& state, Bytes data) {
     (void)getDisplayFromState(state);
-    const DictionaryRef lookup = dictionaryUnder("Lookup", state);
-    const Dictionary nowhere;
-    updateFromLog(data, lookup != nullptr ? *lookup : nowhere, state); // neither is copied
+    updateFromLog(data, dictionaryUnder("Lookup", state), state);
 }
 
-void C2KLogGenerator::updateFromLog(Bytes packet, const Dictionary& lookup, Dictionary& state) {
+void C2KLogGenerator::updateFromLog(Bytes packet, const DictionaryRef& lookup, Dictionary& state) {
     if (packet.size() < LogRecord::kHeaderLength) { // asked of the message, prefix included
         return;
     }
@@ -130,11 +138,28 @@ void C2KLogGenerator::updateFromLog(Bytes packet, const Dictionary& lookup, Dict
     if (parser == kParsers.end()) {
         return;
     }
-    parser->parse(record, state, lookup);
+    if (parser->replacesShown != nullptr && parser->replacesShown(record)) {
+        Kept& kept = _kept[static_cast<std::size_t>(parser - kParsers.begin())];
+        kept.packet.assign(record.bytes().begin(), record.bytes().end());
+        kept.lookup = lookup;
+    } else {
+        const Dictionary nowhere;
+        parser->parse(record, state, lookup != nullptr ? *lookup : nowhere);
+    }
     capture(record.bytes());
 }
 
+void C2KLogGenerator::catchUp() {
+    Dictionary noState; // what may be kept has no running values
+    for (std::size_t place = 0; place < kParsers.size(); ++place) {
+        if (const DictionaryRef lookup = std::exchange(_kept[place].lookup, nullptr)) {
+            kParsers[place].parse(LogRecord(_kept[place].packet), noState, *lookup);
+        }
+    }
+}
+
 PropertyList C2KLogGenerator::generateLogUsingState(Dictionary& state) {
+    catchUp();
     PropertyList display = getDisplayFromState(state);
     handOverCapture(state);
     updateHistoryInState(state, environment().clock);

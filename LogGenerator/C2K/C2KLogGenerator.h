@@ -3,6 +3,8 @@
 #include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/ZORLogGenerator.h"
 
+#include <array>
+#include <cstddef>
 #include <memory>
 #include <vector>
 
@@ -21,12 +23,17 @@ struct CodeDescription;
 /// and the running values of the parsers.
 class C2KLogGenerator final : public ZORLogGenerator {
 public:
+    /// As many as there are parsers.
+    static constexpr std::size_t kLogCodeCount = 8;
+
     static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment);
 
     using ZORLogGenerator::ZORLogGenerator;
+    ~C2KLogGenerator() override;
 
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
+    void catchUp() override;
     PropertyList getStartCommand() const override;
 
     /// Adds a template's rows to a display and their places to a lookup table.
@@ -38,10 +45,19 @@ public:
     /// Framing and dispatch of one packet. A packet of a known code is captured behind its prefix,
     /// whether or not its parser accepts it; nothing else is captured. A wrong log type is
     /// reported, but does not stop the packet.
-    void updateFromLog(Bytes packet, const Dictionary& lookup, Dictionary& state);
+    void updateFromLog(Bytes packet, const DictionaryRef& lookup, Dictionary& state);
 
     /// What the parsers read and show, out of the constants that they read with (Description.h).
     static std::vector<CodeDescription> describe();
+
+private:
+    /// The latest packet of a code whose every packet replaces what the one before has shown: it is
+    /// parsed when somebody looks. Null lookup: none.
+    struct Kept {
+        DictionaryRef lookup;
+        ByteBuffer packet;
+    };
+    std::array<Kept, kLogCodeCount> _kept; // in the order of the parsers
 };
 
 } // namespace pallax

@@ -42,6 +42,10 @@ void parseEVDOActiveSet(const LogRecord& packet, Dictionary& /*state*/, const Di
     setLookupValue("kActiveSetPilots", pilots.listOrNone(), lookup);
 }
 
+bool isWholeEVDOActiveSet(const LogRecord& packet) {
+    return packet.has(kPilots) && packet.has(kPilots + packet.u8(kPilotCount) * kPilotLength);
+}
+
 CodeDescription describeEVDOActiveSet(LogCode logCode) {
     CodeDescription code{logCode, kPilots};
     code.lists = {describePilots("kActiveSetPilots", {kPilots, kPilotLength, kPilotLength},

@@ -20,6 +20,10 @@ struct CodeDescription;
 ///   2     16     energy: 10 x log10(raw / 512), dB
 void parseEVDOActiveSet(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
 
+/// Whether `parseEVDOActiveSet` accepts the packet; it then sets every value that it ever sets, and
+/// logs nothing.
+bool isWholeEVDOActiveSet(const LogRecord& packet);
+
 /// What that reads and shows, under the log code `logCode`.
 CodeDescription describeEVDOActiveSet(LogCode logCode);
 

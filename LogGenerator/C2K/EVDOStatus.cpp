@@ -67,6 +67,10 @@ void parseEVDOStatus(const LogRecord& packet, Dictionary& /*state*/, const Dicti
     setLookupValue("kColorCode", number(kColorCode, kDecimal), lookup);
 }
 
+bool isWholeEVDOStatus(const LogRecord& packet) {
+    return packet.length() == kLength;
+}
+
 CodeDescription describeEVDOStatus(LogCode logCode) {
     constexpr std::int64_t kLargestState = UINT8_MAX;
     const auto whileTransmitting = [](FieldDescription field) {

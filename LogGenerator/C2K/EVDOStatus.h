@@ -24,6 +24,10 @@ struct CodeDescription;
 ///   41    0    8      kColorCode           number
 void parseEVDOStatus(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
 
+/// Whether `parseEVDOStatus` accepts the packet; it then sets every value that it ever sets, and
+/// logs nothing.
+bool isWholeEVDOStatus(const LogRecord& packet);
+
 /// What that reads and shows, under the log code `logCode`.
 CodeDescription describeEVDOStatus(LogCode logCode);
 

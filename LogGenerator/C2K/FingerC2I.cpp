@@ -49,6 +49,11 @@ void parseFingerC2I(const LogRecord& packet, Dictionary& /*state*/, const Dictio
     setLookupValue("kFingerC2I", fingers.listOrNone(), lookup);
 }
 
+bool isWholeFingerC2I(const LogRecord& packet) {
+    return packet.has(kFingers) &&
+           packet.length() == kFingers + packet.u8(kFingerCount) * kFingerLength;
+}
+
 CodeDescription describeFingerC2I(LogCode logCode) {
     CodeDescription code{logCode, kFingers};
     code.lists = {describePilots("kFingerC2I", {kFingers, kFingerLength, kFingerLength},

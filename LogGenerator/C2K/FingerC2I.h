@@ -20,6 +20,10 @@ struct CodeDescription;
 ///   6     16     carrier to interference: 10 x log10(raw / 512), dB
 void parseFingerC2I(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
 
+/// Whether `parseFingerC2I` accepts the packet; it then sets every value that it ever sets, and
+/// logs nothing.
+bool isWholeFingerC2I(const LogRecord& packet);
+
 /// What that reads and shows, under the log code `logCode`.
 CodeDescription describeFingerC2I(LogCode logCode);
 

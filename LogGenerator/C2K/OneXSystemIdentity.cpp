@@ -60,6 +60,10 @@ void parseOneXSystemIdentity(const LogRecord& packet, Dictionary& /*state*/,
     setLookupValue("kProtocolRevision", number(kProtocolRevision), lookup);
 }
 
+bool isWholeOneXSystemIdentity(const LogRecord& packet) {
+    return packet.has(kMinimumLength) && packet.u8(kVersion) >= kLeastVersion;
+}
+
 CodeDescription describeOneXSystemIdentity(LogCode logCode) {
     constexpr std::int64_t kLargestVersion = UINT8_MAX;
     const auto ofKnownSystem = [](FieldDescription field) {

@@ -22,6 +22,10 @@ struct CodeDescription;
 ///   184   16     kBaseId             number; past the end of a shorter packet, so 0
 void parseOneXSystemIdentity(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
 
+/// Whether `parseOneXSystemIdentity` accepts the packet; it then sets every value that it ever
+/// sets, and logs nothing.
+bool isWholeOneXSystemIdentity(const LogRecord& packet);
+
 /// What that reads and shows, under the log code `logCode`.
 CodeDescription describeOneXSystemIdentity(LogCode logCode);
 

@@ -12,6 +12,30 @@ namespace {
 constexpr int kUnknownTypeLine = 78;
 constexpr int kNotDeserializedLine = 90;
 
+// A value's class is its property-list type, under the name that every diagnostic gives it.
+[[noreturn]] void throwUnknownType(const PropertyList& object) {
+    throw GSMLogGenerator::InternalInconsistencyException(
+        formatText("Unknown object of type %@ encountered", {object.typeName()}), kUnknownTypeLine);
+}
+
+/// Throws what making the display form would.
+void requireDisplayForm(const PropertyList& object) {
+    if (object.isString()) {
+        return;
+    }
+    if (const DictionaryRef entries = object.dictionary()) {
+        for (const Dictionary::Entry& entry : *entries) {
+            requireDisplayForm(entry.value);
+        }
+    } else if (const ArrayRef elements = object.array()) {
+        for (const PropertyList& element : *elements) {
+            requireDisplayForm(element);
+        }
+    } else {
+        throwUnknownType(object);
+    }
+}
+
 /// The display form of a value inside a container.
 PropertyList collapsedForm(const PropertyList& object) {
     PropertyList form = GSMLogGenerator::processObject(object);
@@ -19,7 +43,7 @@ PropertyList collapsedForm(const PropertyList& object) {
     return single.isNull() ? form : single;
 }
 
-PropertyList displayForm(const Dictionary& entries) {
+Dictionary displayForm(const Dictionary& entries) {
     Dictionary display;
     display.reserve(entries.size());
     for (const Dictionary::Entry& entry : entries) {
@@ -32,7 +56,7 @@ PropertyList displayForm(const Dictionary& entries) {
     return display;
 }
 
-PropertyList displayForm(const Array& elements) {
+Array displayForm(const Array& elements) {
     Array display;
     display.reserve(elements.size());
     bool isFirst = true;
@@ -57,19 +81,40 @@ std::unique_ptr<LogGenerator> GSMLogGenerator::generator(const GeneratorEnvironm
     return std::make_unique<GSMLogGenerator>(environment);
 }
 
+GSMLogGenerator::~GSMLogGenerator() {
+    GSMLogGenerator::catchUp(); // the display outlives its generator
+}
+
 void GSMLogGenerator::updateState(Dictionary& state, Bytes data) {
     const PropertyListResult object = parsePropertyList(data);
     if (!object) {
         throw InternalInconsistencyException("Could not deserialize the object",
                                              kNotDeserializedLine);
     }
-    PropertyList display = processObject(*object); // before anything is stored, for it may throw
+    requireDisplayForm(*object); // before anything is stored, for it may throw
     state.setFixed("DisplayState", *object);
-    state.setFixed("Display", std::move(display));
+    state.setFixed("Display", displayToCome(*object));
     state.setFixed("ExtraInfo", Dictionary());
 }
 
+PropertyList GSMLogGenerator::displayToCome(const PropertyList& object) {
+    _unshown = object.dictionary();
+    if (_unshown == nullptr) {
+        return processObject(object);
+    }
+    _display = std::make_shared<Dictionary>();
+    return _display;
+}
+
+void GSMLogGenerator::catchUp() {
+    if (_unshown != nullptr) {
+        *_display = displayForm(*_unshown);
+        _unshown = nullptr;
+    }
+}
+
 PropertyList GSMLogGenerator::generateLogUsingState(Dictionary& state) {
+    catchUp();
     updateHistoryInState(state, environment().clock);
     const PropertyList* display = state.find("Display");
     return display != nullptr ? *display : PropertyList();
@@ -93,9 +138,7 @@ PropertyList GSMLogGenerator::processObject(const PropertyList& object) {
     if (const ArrayRef elements = object.array()) {
         return displayForm(*elements);
     }
-    // A value's class is its property-list type, under the name that every diagnostic gives it.
-    throw InternalInconsistencyException(
-        formatText("Unknown object of type %@ encountered", {object.typeName()}), kUnknownTypeLine);
+    throwUnknownType(object);
 }
 
 PropertyList GSMLogGenerator::canCollapse(const PropertyList& object) {

@@ -37,11 +37,13 @@ public:
     static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment);
 
     explicit GSMLogGenerator(const GeneratorEnvironment& environment) : LogGenerator(environment) {}
+    ~GSMLogGenerator() override;
 
     /// Throws InternalInconsistencyException for what is no property list, an empty message
     /// included, and for a value of another type than the three anywhere in it.
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
+    void catchUp() override;
     PropertyList getStartCommand() const override;
     PropertyList getSaveContentsFromState(const Dictionary& state) const override;
 
@@ -53,6 +55,14 @@ public:
 
     /// The single value of a dictionary that has exactly one entry; null for anything else.
     static PropertyList canCollapse(const PropertyList& object);
+
+private:
+    /// The display of an object whose values are of the three types; that of a dictionary is empty
+    /// until `catchUp`, for mostly the next message comes before anybody looks.
+    PropertyList displayToCome(const PropertyList& object);
+
+    DictionaryRef _unshown; // the object whose display is still to be made, or null
+    DictionaryRef _display; // that display, empty until then; it is in the state
 };
 
 } // namespace pallax

@@ -33,6 +33,10 @@ void ConnectedModeMeasurementMisc::updateWithData(const LogRecord& record, LogCo
     showGroup(kGroups, record, logCode);
 }
 
+bool ConnectedModeMeasurementMisc::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 RecordDescription ConnectedModeMeasurementMisc::describe() const {
     return describeGroups(kGroups);
 }

@@ -21,6 +21,7 @@ public:
     }
     std::span<const LogCode> getLogCodeArray() const override;
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
     RecordDescription describe() const override;
 };
 

@@ -48,6 +48,10 @@ void DetectedCells::updateWithData(const LogRecord& record, LogCode logCode) {
     }
 }
 
+bool DetectedCells::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kConnectedModeLogCode && record.has(kConnectedModeLength);
+}
+
 RecordDescription DetectedCells::describe() const {
     const EntryList::Layout behindNoNeighbours = layoutOf(LogRecord());
     ListDescription list =

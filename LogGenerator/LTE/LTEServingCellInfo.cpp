@@ -83,6 +83,10 @@ void LTEServingCellInfo::updateWithData(const LogRecord& record, LogCode logCode
     }
 }
 
+bool LTEServingCellInfo::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kIdentityLogCode && record.has(kIdentityRecordLength);
+}
+
 void LTEServingCellInfo::updateIdentity(const LogRecord& record) {
     if (record.has(kIdentityRecordLength)) {
         removeKey(kUarfcnKey); // the cell monitor's, of the cell before

@@ -22,18 +22,24 @@ constexpr auto kNeighbourFields = std::to_array<Field>({
     {"Filtered RSRQ", u16At(4), Conversion::number(kLevelDb, 0.125, -20.0)},
 });
 
-/// Whether the record claims entries and seems to have room for them; logs why not.
+/// The bytes of the neighbours that the record claims, and those it has for them, as the modem
+/// counts them: in 8 bits.
+struct Sizes {
+    std::uint8_t expected;
+    std::uint8_t actual;
+};
+
+Sizes sizesOf(const LogRecord& record) {
+    const std::size_t measured = kMeasuredEntryLength * record.u8(kMeasuredCountOffset);
+    const std::size_t detected = kDetectedEntryLength * record.u8(kDetectedCountOffset);
+    return {static_cast<std::uint8_t>(measured),
+            static_cast<std::uint8_t>(record.length() - detected)};
+}
+
+/// Whether the record claims entries and seems to have room for them.
 bool sizeIsExpected(const LogRecord& record) {
-    const std::size_t count = record.u8(kMeasuredCountOffset);
-    const std::size_t detectedLength = kDetectedEntryLength * record.u8(kDetectedCountOffset);
-    const auto expected = static_cast<std::uint8_t>(count * kMeasuredEntryLength);
-    const auto actual = static_cast<std::uint8_t>(record.length() - detectedLength);
-    if (count == 0 || expected > actual) {
-        systemLog(LogPriority::Error, "Unexpected log packet bytes size: expected=%d actual=%d",
-                  expected, actual);
-        return false;
-    }
-    return true;
+    const Sizes sizes = sizesOf(record);
+    return record.u8(kMeasuredCountOffset) != 0 && sizes.expected <= sizes.actual;
 }
 
 } // namespace
@@ -51,12 +57,21 @@ void MeasuredNeighborCells::updateWithData(const LogRecord& record, LogCode logC
         return;
     }
     clearList();
-    if (sizeIsExpected(record)) {
-        const EntryList neighbours(record, kNeighbours, record.u8(kMeasuredCountOffset));
-        replaceList(neighbours, [](Dictionary& target, const LogRecord& entry) {
-            fillEntry(target, kNeighbourFields, entry);
-        });
+    if (!sizeIsExpected(record)) {
+        const Sizes sizes = sizesOf(record);
+        systemLog(LogPriority::Error, "Unexpected log packet bytes size: expected=%d actual=%d",
+                  sizes.expected, sizes.actual);
+        return;
     }
+    const EntryList neighbours(record, kNeighbours, record.u8(kMeasuredCountOffset));
+    replaceList(neighbours, [](Dictionary& target, const LogRecord& entry) {
+        fillEntry(target, kNeighbourFields, entry);
+    });
+}
+
+bool MeasuredNeighborCells::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kConnectedModeLogCode && record.has(kConnectedModeLength) &&
+           sizeIsExpected(record);
 }
 
 RecordDescription MeasuredNeighborCells::describe() const {

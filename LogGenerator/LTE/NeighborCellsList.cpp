@@ -79,6 +79,10 @@ void NeighborCellsList::updateWithData(const LogRecord& record, LogCode logCode)
     replaceList(cells, fillCell);
 }
 
+bool NeighborCellsList::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kNeighborMeasurementLogCode && record.has(kNeighborMeasurementLength);
+}
+
 RecordDescription NeighborCellsList::describe() const {
     ListDescription list = describeList("", kCells, kCountLessOne, kCellFields);
     list.plus = 1;

@@ -31,6 +31,10 @@ void NeighborMeasurementMisc::updateWithData(const LogRecord& record, LogCode lo
     showGroup(kGroups, record, logCode);
 }
 
+bool NeighborMeasurementMisc::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 RecordDescription NeighborMeasurementMisc::describe() const {
     return describeGroups(kGroups);
 }

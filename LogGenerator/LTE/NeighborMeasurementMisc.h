@@ -17,6 +17,7 @@ public:
     std::string_view getSectionName() const override { return "Neighbor Measurements"; }
     std::span<const LogCode> getLogCodeArray() const override;
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
     RecordDescription describe() const override;
 };
 

@@ -108,6 +108,10 @@ void ReselectionCandidatesList::updateWithData(const LogRecord& record, LogCode 
     }
 }
 
+bool ReselectionCandidatesList::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kReselectionLogCode && record.has(kReselectionLength);
+}
+
 namespace {
 
 constexpr auto kTechnologyLabels = [] {

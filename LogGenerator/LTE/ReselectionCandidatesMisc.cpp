@@ -31,6 +31,10 @@ void ReselectionCandidatesMisc::updateWithData(const LogRecord& record, LogCode 
     showGroup(kGroups, record, logCode);
 }
 
+bool ReselectionCandidatesMisc::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 RecordDescription ReselectionCandidatesMisc::describe() const {
     return describeGroups(kGroups);
 }

@@ -59,6 +59,10 @@ void ServingCellMeasurement::updateWithData(const LogRecord& record, LogCode log
     showGroup(kGroups, record, logCode);
 }
 
+bool ServingCellMeasurement::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 RecordDescription ServingCellMeasurement::describe() const {
     return describeGroups(kGroups);
 }

@@ -7,8 +7,18 @@
 
 #include <algorithm>
 #include <iterator>
+#include <utility>
 
 namespace pallax {
+
+namespace {
+
+auto findGroup(std::span<const FieldGroup> groups, LogCode logCode) {
+    return std::find_if(groups.begin(), groups.end(),
+                        [logCode](const FieldGroup& each) { return each.logCode == logCode; });
+}
+
+} // namespace
 
 void Base::initWithDict(ClassDict& classDict, CodeDict& codeDict) {
     classDict.insert_or_assign(std::string(getSectionName()), this);
@@ -16,8 +26,35 @@ void Base::initWithDict(ClassDict& classDict, CodeDict& codeDict) {
 }
 
 void Base::updateSectionRef(PropertyList section) {
+    catchUp(); // what was kept is for the section before
     _sectionRef = std::move(section);
     systemLog(LogPriority::Warning, "%s", getSectionName());
+}
+
+void Base::receive(const LogRecord& record, LogCode logCode) {
+    // Whoever reads the lines that records log wants each when its record arrives.
+    const bool keeps =
+        !SystemLog::isEnabled(LogPriority::Warning) && replacesShown(record, logCode);
+    const unsigned kind = keeps ? kindOf(record) : 0;
+    if (!keeps || _keptCode != logCode || _keptKind != kind) {
+        catchUp();
+    }
+    if (!keeps) {
+        return updateWithData(record, logCode);
+    }
+    _kept.assign(record.bytes().begin(), record.bytes().end());
+    _keptCode = logCode;
+    _keptKind = kind;
+}
+
+void Base::catchUp() {
+    if (const auto logCode = std::exchange(_keptCode, std::nullopt)) {
+        updateWithData(LogRecord(_kept), *logCode);
+    }
+}
+
+bool Base::replacesShown(const LogRecord& /*record*/, LogCode /*logCode*/) const {
+    return false;
 }
 
 void Base::updateWithData(const LogRecord& /*record*/, LogCode /*logCode*/) {
@@ -65,14 +102,17 @@ void Base::show(std::span<const Field> fields, const LogRecord& record) {
 }
 
 void Base::showGroup(std::span<const FieldGroup> groups, const LogRecord& record, LogCode logCode) {
-    const auto group = std::find_if(groups.begin(), groups.end(), [logCode](const auto& each) {
-        return each.logCode == logCode;
-    });
+    const auto group = findGroup(groups, logCode);
     if (group == groups.end()) {
         logUnknown(logCode);
     } else if (record.has(group->minimumLength)) {
         show(group->fields, record);
     }
+}
+
+bool Base::isOfGroup(std::span<const FieldGroup> groups, const LogRecord& record, LogCode logCode) {
+    const auto group = findGroup(groups, logCode);
+    return group != groups.end() && record.has(group->minimumLength);
 }
 
 void Base::removeKey(std::string_view key) {

@@ -9,6 +9,7 @@
 
 #include <cstdint>
 #include <map>
+#include <optional>
 #include <span>
 #include <string>
 #include <string_view>
@@ -33,6 +34,10 @@ enum class SectionKind { Keys, List };
 /// record that arrives under one of them into display values.
 ///
 /// A record writes nothing while it has no section, or one of the wrong kind.
+///
+/// Between two looks at the display a modem sends many records of one kind, each of which replaces
+/// all that the one before has shown. A record so replaced need not be read at all: `receive` keeps
+/// the latest, and `catchUp` reads it before somebody looks.
 class Base {
 public:
     Base() = default;
@@ -47,12 +52,26 @@ public:
     /// The section that the template processing has built: a dictionary or an array.
     void updateSectionRef(PropertyList section);
 
+    /// One log record, header included, under its effective code: read now, or kept until `catchUp`
+    /// or until one arrives that does not replace it. What is shown then, and what is logged and
+    /// thrown now, is as if it were always read now.
+    void receive(const LogRecord& record, LogCode logCode);
+    /// Reads the record that was kept. To be called before anybody looks at the section.
+    void catchUp();
+
     /// One log record, header included, under its effective code.
     virtual void updateWithData(const LogRecord& record, LogCode logCode);
     /// The key of the section in the display template.
     virtual std::string_view getSectionName() const;
     /// The effective codes that the record wants, in order.
     virtual std::span<const LogCode> getLogCodeArray() const;
+    /// Whether this record, read right behind any other of its kind under the same code, leaves the
+    /// section as it would without that other, and reading it neither throws nor logs anything as
+    /// urgent as an error. False unless overridden.
+    virtual bool replacesShown(const LogRecord& record, LogCode logCode) const;
+    /// For records that do not always set the same keys: a number that is the same for those that
+    /// do.
+    virtual unsigned kindOf(const LogRecord& /*record*/) const { return 0; }
     /// What kind of section the template must hold for this record.
     virtual SectionKind sectionKind() const { return SectionKind::Keys; }
     /// What `updateWithData` reads and shows, out of the tables that it reads with (Description.h).
@@ -77,6 +96,9 @@ protected:
     /// Shows the fields of the group for `logCode`. A record shorter than the group's minimum
     /// changes nothing; a code that has no group is logged as unknown.
     void showGroup(std::span<const FieldGroup> groups, const LogRecord& record, LogCode logCode);
+    /// True for what `showGroup` would show.
+    static bool isOfGroup(std::span<const FieldGroup> groups, const LogRecord& record,
+                          LogCode logCode);
     void removeKey(std::string_view key);
 
     // For records whose section is a list.
@@ -111,6 +133,9 @@ private:
 
     PropertyList _sectionRef; // shared with the live display, which owns it
     Array _spares;
+    std::optional<LogCode> _keptCode; // of the record that is kept
+    unsigned _keptKind = 0;
+    ByteBuffer _kept;
 };
 
 } // namespace pallax

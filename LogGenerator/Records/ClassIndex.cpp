@@ -27,6 +27,12 @@ std::vector<std::string> ClassIndex::getAllLogCodes() const {
     return codes;
 }
 
+void ClassIndex::catchUp() const {
+    for (const auto& [name, record] : classDict) {
+        record->catchUp();
+    }
+}
+
 void ClassIndex::status() const {
     // The section dictionary is one by its type here; the two lines stay for those who read logs.
     systemLog(LogPriority::Warning, "Dictionary = %d", 1);

@@ -29,6 +29,8 @@ public:
     const std::vector<Base*>* getSubscribers(LogCode logCode) const;
     /// Every code that has a subscriber, as decimal text, ascending.
     std::vector<std::string> getAllLogCodes() const;
+    /// Brings every section up to the latest record.
+    void catchUp() const;
     /// Logs what the section dictionary is.
     void status() const;
 

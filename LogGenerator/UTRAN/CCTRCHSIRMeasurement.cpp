@@ -45,6 +45,10 @@ void CCTRCHSIRMeasurement::updateWithData(const LogRecord& record, LogCode logCo
         [](const LogRecord& entry, std::size_t /*index*/) { return channelOf(entry); }));
 }
 
+bool CCTRCHSIRMeasurement::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kChannelQualityLogCode && record.has(kChannelQualityMinimumLength);
+}
+
 RecordDescription CCTRCHSIRMeasurement::describe() const {
     ListDescription ratios;
     ratios.key = kRatiosKey;

@@ -30,6 +30,10 @@ void TRCHBLERMeasurement::updateWithData(const LogRecord& record, LogCode logCod
     });
 }
 
+bool TRCHBLERMeasurement::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kChannelQualityLogCode && record.has(kChannelQualityMinimumLength);
+}
+
 RecordDescription TRCHBLERMeasurement::describe() const {
     CodeDescription code{kChannelQualityLogCode, kChannelQualityMinimumLength};
     code.lists = {describeList("", kTransportChannels, kTransportChannelCount, kFields)};

@@ -20,6 +20,7 @@ public:
     std::span<const LogCode> getLogCodeArray() const override;
     SectionKind sectionKind() const override { return SectionKind::List; }
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
     RecordDescription describe() const override;
 };
 

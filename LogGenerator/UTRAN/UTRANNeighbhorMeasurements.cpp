@@ -61,6 +61,10 @@ void UTRANNeighbhorMeasurements::updateWithData(const LogRecord& record, LogCode
     replaceList(cells, fillCell);
 }
 
+bool UTRANNeighbhorMeasurements::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kNeighboursLogCode && record.has(kMinimumLength);
+}
+
 RecordDescription UTRANNeighbhorMeasurements::describe() const {
     ListDescription list = describeList("", kCells, kCellCount, kFields);
     for (FieldDescription& field : list.fields) {

@@ -52,6 +52,10 @@ void UTRANServingCellInfo::updateWithData(const LogRecord& record, LogCode logCo
     }
 }
 
+bool UTRANServingCellInfo::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kServingCellLogCode && record.has(kServingCellLength);
+}
+
 void UTRANServingCellInfo::updateFromCellMonitor(const LogRecord& record) {
     const auto cells = readCellMonitorArray(record);
     if (!cells) {

@@ -49,6 +49,10 @@ void BLER::updateWithData(const LogRecord& record, LogCode logCode) {
     }));
 }
 
+bool BLER::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kBlockErrorLogCode && record.has(kMinimumLength);
+}
+
 RecordDescription BLER::describe() const {
     CodeDescription code{kBlockErrorLogCode, kMinimumLength};
     code.fields = describeFields(kFields);

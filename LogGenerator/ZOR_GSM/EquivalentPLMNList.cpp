@@ -53,6 +53,10 @@ void EquivalentPLMNList::updateWithData(const LogRecord& record, LogCode logCode
     }
 }
 
+bool EquivalentPLMNList::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kEquivalentPLMNLogCode && record.has(kMinimumLength);
+}
+
 RecordDescription EquivalentPLMNList::describe() const {
     const auto digits = [](std::string_view key, std::size_t first) {
         return describeComputed(key, kDecimal, "digits",

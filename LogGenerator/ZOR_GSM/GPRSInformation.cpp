@@ -126,6 +126,10 @@ void GPRSInformation::updateWithData(const LogRecord& record, LogCode logCode) {
     showGroup(kGroups, record, logCode);
 }
 
+bool GPRSInformation::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 RecordDescription GPRSInformation::describe() const {
     return describeGroups(kGroups);
 }

@@ -43,6 +43,7 @@ public:
     std::string_view getSectionName() const override { return "GPRS Information"; }
     std::span<const LogCode> getLogCodeArray() const override;
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
     RecordDescription describe() const override;
 };
 

@@ -77,6 +77,10 @@ void GSMRRInfo::updateWithData(const LogRecord& record, LogCode logCode) {
     showGroup(kGroups, record, logCode);
 }
 
+bool GSMRRInfo::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 RecordDescription GSMRRInfo::describe() const {
     return describeGroups(kGroups);
 }

@@ -34,6 +34,7 @@ public:
     std::string_view getSectionName() const override { return "GSM RR Info"; }
     std::span<const LogCode> getLogCodeArray() const override;
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
     RecordDescription describe() const override;
 };
 

@@ -60,6 +60,10 @@ void GSMServingCell::updateWithData(const LogRecord& record, LogCode logCode) {
     }
 }
 
+bool GSMServingCell::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 void GSMServingCell::showServingCell(const LogRecord& record) {
     const std::optional<Array> cells = cellMonitorArrayOrLog(record);
     if (!cells) {

@@ -47,6 +47,10 @@ void GSMSet::updateWithData(const LogRecord& record, LogCode logCode) {
     }
 }
 
+bool GSMSet::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kRankingLogCode && record.has(kRankingRecordLength);
+}
+
 RecordDescription GSMSet::describe() const {
     CodeDescription code{kRankingLogCode, kRankingRecordLength};
     code.lists = {describeList("", {kRankingEntriesStart, kEntryLength, kEntryLength},

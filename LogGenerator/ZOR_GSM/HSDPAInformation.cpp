@@ -75,6 +75,17 @@ void HSDPAInformation::updateWithData(const LogRecord& record, LogCode logCode) 
          processesOf(record, kProcessesStart + kPrimaryStride * primaryCount, secondaryCount));
 }
 
+bool HSDPAInformation::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kHarqLogCode && record.has(kMinimumLength);
+}
+
+unsigned HSDPAInformation::kindOf(const LogRecord& record) const {
+    constexpr unsigned kSetsPrimary = 1;
+    constexpr unsigned kSetsSecondary = 2;
+    return (record.u8(kPrimaryCountOffset) != 0 ? kSetsPrimary : 0) |
+           (record.u8(kSecondaryCountOffset) != 0 ? kSetsSecondary : 0);
+}
+
 RecordDescription HSDPAInformation::describe() const {
     const EntryList::Layout processes{kProcessesStart, kProcessLength, kProcessLength};
     ListDescription primary =

@@ -29,6 +29,9 @@ public:
     std::string_view getSectionName() const override { return "HSDPA Info"; }
     std::span<const LogCode> getLogCodeArray() const override;
     void updateWithData(const LogRecord& record, LogCode logCode) override;
+    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
+    /// A list without entries is not set.
+    unsigned kindOf(const LogRecord& record) const override;
     RecordDescription describe() const override;
 };
 

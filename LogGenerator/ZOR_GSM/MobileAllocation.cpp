@@ -42,6 +42,10 @@ void MobileAllocation::updateWithData(const LogRecord& record, LogCode logCode) 
     }));
 }
 
+bool MobileAllocation::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kMobileAllocationLogCode && record.has(kMinimumLength);
+}
+
 RecordDescription MobileAllocation::describe() const {
     ListDescription list = describeList(kChannelsKey, kChannels, u8At(kCountOffset), {});
     list.fields = {describeField({"", kChannelNumber, Conversion::number()})};

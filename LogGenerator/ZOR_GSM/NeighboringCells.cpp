@@ -69,6 +69,10 @@ void NeighboringCells::updateWithData(const LogRecord& record, LogCode logCode) 
     }
 }
 
+bool NeighboringCells::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kMeasurementLogCode && record.has(kMeasurementLength);
+}
+
 void NeighboringCells::showMeasuredCells(const LogRecord& record) {
     if (!record.has(kMeasurementLength)) {
         return;

@@ -29,6 +29,10 @@ void ProcessCO::updateWithData(const LogRecord& record, LogCode logCode) {
     showGroup(kGroups, record, logCode);
 }
 
+bool ProcessCO::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 RecordDescription ProcessCO::describe() const {
     return describeGroups(kGroups);
 }

@@ -52,6 +52,10 @@ void ProcessCS::updateWithData(const LogRecord& record, LogCode logCode) {
     showGroup(kGroups, record, logCode);
 }
 
+bool ProcessCS::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 RecordDescription ProcessCS::describe() const {
     return describeGroups(kGroups);
 }

@@ -67,6 +67,10 @@ void ProcessPS::updateWithData(const LogRecord& record, LogCode logCode) {
     showGroup(kGroups, record, logCode);
 }
 
+bool ProcessPS::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return isOfGroup(kGroups, record, logCode);
+}
+
 RecordDescription ProcessPS::describe() const {
     return describeGroups(kGroups);
 }

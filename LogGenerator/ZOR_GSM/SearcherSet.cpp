@@ -41,6 +41,10 @@ void SearcherSet::updateWithData(const LogRecord& record, LogCode logCode) {
     }
 }
 
+bool SearcherSet::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kSearcherLogCode && record.has(kMinimumLength);
+}
+
 RecordDescription SearcherSet::describe() const {
     CodeDescription code{kSearcherLogCode, kMinimumLength};
     code.note = "Empties the list; none of the record's cells is shown.";

@@ -18,6 +18,7 @@ public:
     std::span<const LogCode> getLogCodeArray() const final;
     SectionKind sectionKind() const final { return SectionKind::List; }
     void updateWithData(const LogRecord& record, LogCode logCode) final;
+    bool replacesShown(const LogRecord& record, LogCode logCode) const final;
     RecordDescription describe() const override;
 
 protected:

@@ -62,6 +62,10 @@ void UMTSSet::updateWithData(const LogRecord& record, LogCode logCode) {
     }
 }
 
+bool UMTSSet::replacesShown(const LogRecord& record, LogCode logCode) const {
+    return logCode == kRankingLogCode && record.has(kRankingRecordLength);
+}
+
 void UMTSSet::updateFromRanking(const LogRecord& record) {
     if (!record.has(kRankingRecordLength)) {
         return;

@@ -26,6 +26,9 @@ public:
         show("Code", DisplayNumber(std::int64_t{logCode}, kDecimal));
         show("Length", DisplayNumber(static_cast<std::int64_t>(record.length()), kDecimal));
     }
+    bool replacesShown(const LogRecord& record, LogCode /*logCode*/) const override {
+        return record.u8(LogRecord::kHeaderLength) != 0xEE;
+    }
 };
 
 class First final : public Probe {
@@ -199,6 +202,42 @@ TEST_F(ZORLogGenerator2Test, ARecordThatThrowsLetsItsExceptionLeaveAndIsNotCaptu
                  ArrayOutOfBoundsException);
     (void)_generator.generateLogUsingState(_state);
     EXPECT_EQ(*_state.find("DisplayState"), PropertyList::data({}));
+}
+
+/// While nobody reads the log, the probes keep what they get.
+const PropertyList kShownOfTheLatest =
+    Dictionary{{"First", Dictionary{{"Code", "16662"}, {"Length", "40"}}},
+               {"Group", Dictionary{{"Second", Dictionary{{"Code", "16662"}, {"Length", "40"}}}}}};
+
+TEST_F(ZORLogGenerator2Test, KeptRecordsAreReadWhenTheDisplayIsGenerated) {
+    _generator.updateState(_state, Record(0x4116).bytes());
+    _generator.updateState(_state, Record(0x4116).padTo(40).bytes());
+    EXPECT_EQ(display(), kEmptyDisplay);
+    EXPECT_EQ(_generator.generateLogUsingState(_state), kShownOfTheLatest);
+}
+
+TEST_F(ZORLogGenerator2Test, KeptRecordsAreReadWhenSomebodyCatchesUp) {
+    _generator.updateState(_state, Record(0x4116).padTo(40).bytes());
+    EXPECT_EQ(display(), kEmptyDisplay);
+    _generator.catchUp();
+    EXPECT_EQ(display(), kShownOfTheLatest);
+}
+
+TEST_F(ZORLogGenerator2Test, KeptRecordsAreReadBeforeTheGeneratorGoes) {
+    auto generator = std::make_unique<ProbeGenerator>(_fixture.environment());
+    generator->updateState(_state, Record(0x4116).padTo(40).bytes());
+    generator.reset();
+    EXPECT_EQ(display(), kShownOfTheLatest);
+}
+
+TEST_F(ZORLogGenerator2Test, ARecordThatThrowsDoesSoAtOnceBehindTheKeptOne) {
+    _generator.updateState(_state, Record(0x4116).padTo(40).bytes());
+    EXPECT_THROW(_generator.updateState(_state, Record(0x4116).u8(0xEE).bytes()),
+                 ArrayOutOfBoundsException);
+    EXPECT_EQ(*display().dictionary()->find("First"),
+              *kShownOfTheLatest.dictionary()->find("First"));
+    _generator.catchUp();
+    EXPECT_EQ(display(), kShownOfTheLatest) << "of the second, which the throw has kept from both";
 }
 
 TEST_F(ZORLogGenerator2Test, SubscribedCodesBecomeTheStartCommand) {

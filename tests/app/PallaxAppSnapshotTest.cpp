@@ -260,6 +260,22 @@ TEST_F(SaveViewTest, OfTheObjectStreamModemItHoldsTheHistoryAndNoDLF) {
     }
 }
 
+TEST_F(SaveViewTest, TheDisplaysOfTheHistoryShareTheirSectionsWithWhatArrivesBeforeTheSave) {
+    const auto onChannel = [](unsigned channel) {
+        return Record(0x1183).u8(channel).padTo(50).prefixed();
+    };
+    resources.add("C2KTemplate", Dictionary{{"Serving", Dictionary{{"Channel", "kChannel"}}}});
+    launchWith(technologies(), "Zorell_CDMA");
+    ports.deliver(onChannel(25));
+    advance(PallaxModel::kDisplayInterval);
+    app->showSaveView();
+    ports.deliver(onChannel(26));
+    queue.runReady();
+    app->saveViewController()->savePressed();
+    EXPECT_EQ(savedData().front().dictionary()->find("Display")->description(),
+              "{ Serving = { Channel = 26; }; }");
+}
+
 /// A technology with its real generator and template, and a log code that its records read.
 struct RealTechnology {
     const char* identifier;

@@ -35,7 +35,8 @@ protected:
                                                    .queue = queue,
                                                    .snapshotDirectory =
                                                        "/var/mobile/Library/Logs/Faultbox",
-                                                   .closeSaveView = [this] { ++closes; }},
+                                                   .closeSaveView = [this] { ++closes; },
+                                                   .catchUp = [] {}},
             saveHistory);
         screen = made.get();
         return made;

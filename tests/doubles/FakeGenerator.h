@@ -30,6 +30,7 @@ public:
     bool refusePackets = false; ///< the next packets throw, as a malformed record does
     PropertyList display;       ///< put into the state by the next display; null: left alone
     int displaysMade = 0;
+    int caughtUp = 0;
 
     void updateState(Dictionary& /*state*/, Bytes data) override {
         if (refusePackets) {
@@ -45,6 +46,7 @@ public:
         const PropertyList* shown = state.find("Display");
         return shown != nullptr ? *shown : PropertyList();
     }
+    void catchUp() override { ++caughtUp; }
     PropertyList getStartCommand() const override { return Dictionary{{"Start", "Fake"}}; }
     PropertyList getSaveContentsFromState(const Dictionary& state) const override {
         return Array{state};

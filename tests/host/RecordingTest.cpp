@@ -5,6 +5,8 @@
 
 #include <gtest/gtest.h>
 
+#include <csignal>
+#include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -262,8 +264,10 @@ TEST(RecordedTechnology, IsFoundByLinkTypeAndByCommandName) {
 class RecordingWriterTest : public RecordingTest {
 protected:
     static constexpr Time kTime{std::chrono::nanoseconds(1700000000'000000007)};
-    std::unique_ptr<RecordingWriter> create() {
-        auto writer = RecordingWriter::create(_folder.file("r.pcap"), 150);
+    std::unique_ptr<RecordingWriter>
+    create(const char* name = "r.pcap",
+           RecordingWriter::Flush flush = RecordingWriter::Flush::EachPacket) {
+        auto writer = RecordingWriter::create(_folder.file(name), 150, flush);
         EXPECT_TRUE(writer);
         return std::move(writer).value();
     }
@@ -303,6 +307,36 @@ TEST_F(RecordingWriterTest, WhatIsWrittenIsReadAgain) {
     EXPECT_TRUE((*result)->next());
     EXPECT_FALSE((*result)->next());
     EXPECT_FALSE((*result)->error());
+}
+
+TEST_F(RecordingWriterTest, BlocksHoldWhatSinglePacketsWouldHave) {
+    const auto each = create();
+    const auto blocks = create("blocks.pcap", RecordingWriter::Flush::InBlocks);
+    for (int count = 0; count < 40; ++count) { // more than ten blocks
+        const ByteBuffer packet(100000, static_cast<std::uint8_t>(count));
+        EXPECT_FALSE(each->write(kTime, packet));
+        EXPECT_FALSE(blocks->write(kTime, packet));
+    }
+    EXPECT_FALSE(blocks->flush());
+    EXPECT_TRUE(doubles::contentOf(_folder.file("blocks.pcap")) ==
+                doubles::contentOf(_folder.file("r.pcap")));
+}
+
+TEST_F(RecordingWriterTest, ABlockThatCannotBeWrittenIsToldWithTheNext) {
+    const auto before = std::signal(SIGPIPE, SIG_IGN);
+    const std::string pipe = _folder.file("pipe");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
+    const int reader = ::open(pipe.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
+    ASSERT_GE(reader, 0);
+    const auto writer = create("pipe", RecordingWriter::Flush::InBlocks);
+    ::close(reader);
+    const ByteBuffer block(RecordingWriter::kLargestPacket);
+    EXPECT_FALSE(writer->write(kTime, block));
+    const auto error = writer->write(kTime, block);
+    ASSERT_TRUE(error);
+    EXPECT_EQ(error->sentence, "The recording " + pipe + " cannot be written: Broken pipe.");
+    EXPECT_TRUE(error->readerHasGone);
+    std::signal(SIGPIPE, before);
 }
 
 TEST_F(RecordingWriterTest, RefusesWhatNoReaderWouldTake) {

@@ -105,6 +105,7 @@ public:
 
     void feed(Bytes packet) {
         _generator->updateState(_state, packet);
+        _generator->catchUp();
         if (const PropertyList* display = _state.find("Display")) {
             _keys.see(*display);
         }

@@ -23,6 +23,7 @@ TEST(LteDrive, FillsEverySectionBeforeItEnds) {
     std::set<std::string> technologies;
     for (const SamplePacket& packet : lteDrivePackets()) {
         generator->updateState(state, packet.data);
+        generator->catchUp();
         const DictionaryRef display = state.find("Display")->dictionary();
         for (const PropertyList& each : *display->find("Reselection Candidates List")->array()) {
             const PropertyList* technology = each.dictionary()->find("Candidate RAT Type");

@@ -5,9 +5,11 @@
 #include "telephony/simulator/ifx/ShortText.h"
 #include "telephony/simulator/ifx/Words.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 #include <cstdint>
+#include <limits>
 #include <string_view>
 
 namespace pallax::ifx {
@@ -80,5 +82,73 @@ private:
     std::array<Open, kDeepest + 1> _open; ///< the first one holds the root
     std::size_t _depth = 0;
 };
+
+// Inline: a picture is told by some seventy calls, which cost a tenth of its time otherwise.
+
+/// The place of the object's content, behind its marker: all in one piece, for what a message
+/// costs is the number of pieces that it is put together from.
+inline std::uint8_t* putMarker(MessageBuffer& out, binary_form::Kind kind, std::size_t count,
+                               std::size_t length) {
+    constexpr unsigned kHalfByte = 4;
+    const unsigned high = unsigned{kind} << kHalfByte;
+    if (count < binary_form::kCountFollows) {
+        std::uint8_t* place = out.room(1 + length);
+        *place++ = static_cast<std::uint8_t>(high | count);
+        return place;
+    }
+    // The count follows as an integer, of one byte: all that is told is shorter than 256.
+    out.put(static_cast<std::uint8_t>(high | binary_form::kCountFollows));
+    out.put(binary_form::kInteger << kHalfByte);
+    out.put(static_cast<std::uint8_t>(count));
+    return out.room(length);
+}
+
+/// The place behind them. All eight bytes are written, whatever their count.
+inline std::uint8_t* BinaryObjectWriter::References::putTo(std::uint8_t* place) const {
+    constexpr unsigned kBitsPerByte = 8;
+    static_assert(kMostInContainer <= kShortPiece);
+    for (unsigned byte = 0; byte < kMostInContainer; ++byte) {
+        place[byte] = static_cast<std::uint8_t>(bytes >> (kBitsPerByte * byte));
+    }
+    return place + count;
+}
+
+/// The place of its content.
+inline std::uint8_t* BinaryObjectWriter::beginObject(binary_form::Kind kind, std::size_t count,
+                                                     std::size_t length) {
+    if (count > std::numeric_limits<std::uint8_t>::max()) {
+        refuseMessage();
+    }
+    _offsets.putNumber(_message.size(), kOffsetWidth);
+    return putMarker(_message, kind, count, length);
+}
+
+inline void BinaryObjectWriter::endObject() {
+    _open[_depth].values.add(_objects++);
+}
+
+inline void BinaryObjectWriter::text(const ShortText& text) {
+    const std::size_t size = text.view().size();
+    copyShortPiece(beginObject(binary_form::kAscii, size, size), text.view().data());
+    endObject();
+}
+
+inline void BinaryObjectWriter::text(std::string_view text) {
+    std::ranges::copy(text, beginObject(binary_form::kAscii, text.size(), text.size()));
+    endObject();
+}
+
+inline void BinaryObjectWriter::endDictionary() {
+    const Open& open = end();
+    const std::size_t count = open.keys.count;
+    open.values.putTo(open.keys.putTo(beginObject(binary_form::kDictionary, count, 2 * count)));
+    endObject();
+}
+
+inline void BinaryObjectWriter::endArray() {
+    const References& elements = end().values;
+    elements.putTo(beginObject(binary_form::kArray, elements.count, elements.count));
+    endObject();
+}
 
 } // namespace pallax::ifx

@@ -41,7 +41,10 @@ protected:
         _generator.updateState(_state, message);
         _lines = log.take();
     }
-    PropertyList display() const { return *_state.find("Display"); }
+    PropertyList display() {
+        _generator.catchUp();
+        return *_state.find("Display");
+    }
     /// What has been captured since the previous call.
     ByteBuffer captured() {
         (void)_generator.generateLogUsingState(_state);
@@ -285,6 +288,7 @@ TEST_F(C2KWithoutTemplate, OneThatComesLaterIsUsed) {
     _generator.updateState(_state, statusOn(25).prefixed());
     _fixture.resources.add("C2KTemplate", kTemplate);
     _generator.updateState(_state, statusOn(26).prefixed());
+    _generator.catchUp();
     EXPECT_EQ(*_state.find("Display"), displayOn("26"));
 }
 
@@ -322,6 +326,30 @@ TEST(Technologies, TheCDMAIdentifierGivesTheCDMAGeneratorAndIsComparedBetweenGSM
     ASSERT_TRUE(found != rows.end() && found != rows.begin() && found + 1 != rows.end());
     EXPECT_EQ((found - 1)->identifier, kHXLogChannelTechnology_Zorell_GSM);
     EXPECT_EQ((found + 1)->identifier, kHXLogChannelTechnology_Zorell_LTE);
+}
+
+TEST_F(C2KLogGeneratorTest, OfPacketsThatReplaceEachOtherTheLatestIsShownWhenSomebodyLooks) {
+    _generator.updateState(_state, statusOn(25).bytes());
+    _generator.updateState(_state, statusOn(26).bytes());
+    EXPECT_EQ(*_state.find("Display"), displayOn(""));
+    EXPECT_EQ(_generator.generateLogUsingState(_state), displayOn("26"));
+    _generator.updateState(_state, statusOn(27).bytes());
+    _generator.catchUp();
+    EXPECT_EQ(*_state.find("Display"), displayOn("27"));
+}
+
+TEST_F(C2KLogGeneratorTest, ThePacketThatWaitsIsShownBeforeTheGeneratorGoes) {
+    auto generator = C2KLogGenerator::generator(_fixture.environment());
+    generator->updateState(_state, statusOn(25).bytes());
+    generator.reset();
+    EXPECT_EQ(*_state.find("Display"), displayOn("25"));
+}
+
+TEST_F(C2KLogGeneratorTest, APacketThatIsRefusedReplacesNothing) {
+    _generator.updateState(_state, statusOn(25).bytes());
+    _generator.updateState(_state, statusOn(26).padTo(51).bytes());
+    _generator.catchUp();
+    EXPECT_EQ(*_state.find("Display"), displayOn("25"));
 }
 
 } // namespace

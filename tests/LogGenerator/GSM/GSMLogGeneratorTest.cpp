@@ -34,6 +34,7 @@ struct Stream {
     }
 
     PropertyList value(std::string_view key) const {
+        generator->catchUp();
         const PropertyList* found = state.find(key);
         return found != nullptr ? *found : PropertyList();
     }
@@ -351,6 +352,30 @@ TEST(GSMLogGeneratorProperty, AnyBytesAreDisplayedOrLeaveTheStateAsItWas) {
             RC_ASSERT(stream.value("Display").description() == shown.description());
         }
     }));
+}
+
+TEST_F(GSMLogGeneratorTest, TheDisplayOfADictionaryIsMadeWhenSomebodyLooks) {
+    feed(xmlMessage(Dictionary{{"Cell", Dictionary{{"ARFCN", "11"}}}}));
+    feed(xmlMessage(kExample));
+    EXPECT_TRUE(state.find("Display")->dictionary()->empty());
+    EXPECT_EQ(generator->generateLogUsingState(state), PropertyList(kExampleDisplay));
+    EXPECT_EQ(*state.find("Display"), PropertyList(kExampleDisplay));
+    EXPECT_EQ(*history().back().dictionary()->find("Display"), PropertyList(kExampleDisplay));
+}
+
+TEST_F(GSMLogGeneratorTest, TheDisplayIsMadeBeforeTheGeneratorGoes) {
+    feed(xmlMessage(kExample));
+    generator.reset();
+    EXPECT_EQ(*state.find("Display"), PropertyList(kExampleDisplay));
+}
+
+TEST_F(GSMLogGeneratorTest, AMessageThatIsRefusedLeavesTheDisplayToCome) {
+    feed(xmlMessage(kExample));
+    EXPECT_EQ(failureOf(bytesOf("{")), kNotDeserialized);
+    EXPECT_EQ(value("Display"), PropertyList(kExampleDisplay));
+    feed(xmlMessage(Dictionary{{"Cell", Dictionary{{"ARFCN", "11"}}}}));
+    feed(bytesOf("\"no service\""));
+    EXPECT_EQ(value("Display"), PropertyList("no service")) << "and not the dictionary before it";
 }
 
 } // namespace

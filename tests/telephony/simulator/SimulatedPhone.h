@@ -43,6 +43,7 @@ public:
     const LogGenerator& generator() const { return *_generator; }
 
     const DictionaryRef display() const {
+        _generator->catchUp();
         const PropertyList* display = _state.find("Display");
         return display != nullptr ? display->dictionary() : nullptr;
     }

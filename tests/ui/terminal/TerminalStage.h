@@ -122,7 +122,8 @@ public:
         }
         _saveScreen = std::make_shared<PallaxSaveViewController>(
             PallaxSaveViewController::Surroundings{frontEnd.toolkit(), files, clock, queue,
-                                                   "/snapshots", [this] { closeSaveScreen(); }},
+                                                   "/snapshots", [this] { closeSaveScreen(); },
+                                                   [] {}},
             saveHistory);
         _stack->presentModal(_saveScreen, true);
     }
