@@ -117,62 +117,74 @@ void CsvOutput::show(const DisplayMoment& moment, const PropertyList& display) {
     _before.swap(_order);
     _order.clear();
     _time = isoTimeText(moment.time);
-    showValue("/", display);
+    _path = "/";
+    showValue(display);
     for (auto at = _shown.begin(); at != _shown.end();) {
         if (at->second.display == _display) {
             ++at;
             continue;
         }
-        writeRow(at->first.first, kNoCells);
+        writeRow(at->second, kNoCells);
         at = _shown.erase(at);
     }
 }
 
 /// Walks the values as the display tree does, which keeps only texts.
-void CsvOutput::showValue(const std::string& path, const PropertyList& value) {
+void CsvOutput::showValue(const PropertyList& value) {
     if (const DictionaryRef dictionary = value.dictionary()) {
         for (const ShownEntry& entry : shownEntries(*dictionary)) {
-            showValue(childPath(path, entry.name), *entry.value);
+            showChild(entry.name, *entry.value);
         }
     } else if (const ArrayRef array = value.array()) {
         int number = 0;
         for (const PropertyList& element : *array) {
             if (!element.isNull()) {
-                showValue(childPath(path, std::to_string(number++)), element);
+                showChild(std::to_string(number++), element);
             }
         }
     } else if (!value.isNull()) {
-        showLeaf(path, value);
+        showLeaf(value);
     }
 }
 
-void CsvOutput::showLeaf(const std::string& path, const PropertyList& value) {
-    const auto row = rowOf(path);
+void CsvOutput::showChild(std::string_view name, const PropertyList& value) {
+    const std::size_t length = _path.size();
+    const std::size_t lengthWithoutSlashes = _path.find_last_not_of('/') + 1;
+    makeChildPath(_path, name);
+    showValue(value);
+    _path.resize(lengthWithoutSlashes);
+    _path.resize(length, '/');
+}
+
+void CsvOutput::showLeaf(const PropertyList& value) {
+    const auto row = rowOfPath();
     _order.push_back(row);
     Shown& shown = row->second;
     const bool isNew = shown.display == 0;
     shown.display = _display;
-    if (!isNew && isSameText(shown.value, value)) {
+    if (isNew) {
+        appendCell(shown.pathCell, _path);
+    } else if (isSameText(shown.value, value)) {
         return;
     }
     std::string cells = cellsOf(value);
     if (isNew || shown.cells != cells) {
-        writeRow(path, cells);
+        writeRow(shown, cells);
         shown.cells = std::move(cells);
     }
     shown.value = value;
 }
 
-/// The row of the next node at a path; a new one has no display yet.
-CsvOutput::Rows::iterator CsvOutput::rowOf(const std::string& path) {
+/// The row of the next node at the path; a new one has no display yet.
+CsvOutput::Rows::iterator CsvOutput::rowOfPath() {
     if (_order.size() < _before.size()) {
         const auto next = _before[_order.size()];
-        if (next->first.second == 0 && next->first.first == path &&
+        if (next->first.second == 0 && next->first.first == _path &&
             next->second.display != _display) {
             return next;
         }
     }
-    std::pair<std::string, int> key(path, 0);
+    std::pair<std::string, int> key(_path, 0);
     auto row = _shown.try_emplace(key).first;
     while (row->second.display == _display) {
         ++key.second;
@@ -181,11 +193,11 @@ CsvOutput::Rows::iterator CsvOutput::rowOf(const std::string& path) {
     return row;
 }
 
-void CsvOutput::writeRow(std::string_view path, std::string_view cells) {
+void CsvOutput::writeRow(const Shown& shown, std::string_view cells) {
     std::string& text = _output.text();
     text += _time;
     text += ',';
-    appendCell(text, path);
+    text += shown.pathCell;
     text += ',';
     text += cells;
     text += '\n';

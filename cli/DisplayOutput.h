@@ -66,16 +66,19 @@ public:
 private:
     struct Shown {
         PropertyList value;
-        std::string cells; ///< "value,number,unit" as written
+        std::string pathCell; ///< the path as written
+        std::string cells;    ///< "value,number,unit" as written
         std::uint64_t display = 0;
     };
     /// By path and count of earlier nodes of the same path in the display.
     using Rows = std::map<std::pair<std::string, int>, Shown>;
 
-    void showValue(const std::string& path, const PropertyList& value);
-    void showLeaf(const std::string& path, const PropertyList& value);
-    Rows::iterator rowOf(const std::string& path);
-    void writeRow(std::string_view path, std::string_view cells);
+    /// The value at `_path`.
+    void showValue(const PropertyList& value);
+    void showChild(std::string_view name, const PropertyList& value);
+    void showLeaf(const PropertyList& value);
+    Rows::iterator rowOfPath();
+    void writeRow(const Shown& shown, std::string_view cells);
 
     Output& _output;
     Rows _shown;
@@ -85,6 +88,7 @@ private:
     std::vector<Rows::iterator> _order;
     std::uint64_t _display = 0;
     std::string _time;
+    std::string _path; ///< of the value that is being shown
 };
 
 } // namespace pallax

@@ -122,14 +122,18 @@ NodeRef PallaxModelNode::makeTreeFromObject(const PropertyList& object,
     return TreeBuilder(pathDictionary).root(object);
 }
 
-std::string childPath(std::string_view parent, std::string_view name) {
-    const std::size_t parentEnd = parent.find_last_not_of('/') + 1; // 0 where there is none
+void makeChildPath(std::string& path, std::string_view name) {
     const std::size_t nameStart = std::min(name.find_first_not_of('/'), name.size());
-    std::string path;
-    path.reserve(parentEnd + 1 + name.size() - nameStart);
-    path += parent.substr(0, parentEnd);
+    path.resize(path.find_last_not_of('/') + 1); // to nothing where there is none
     path += '/';
     path += name.substr(nameStart);
+}
+
+std::string childPath(std::string_view parent, std::string_view name) {
+    std::string path;
+    path.reserve(parent.size() + 1 + name.size());
+    path = parent;
+    makeChildPath(path, name);
     return path;
 }
 

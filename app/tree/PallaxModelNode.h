@@ -111,5 +111,7 @@ private:
 /// The path of the child `name` below `parent`, joined by exactly one slash: "/" + "A" is "/A",
 /// "/A" + "B" and "/A" + "/B" are "/A/B".
 std::string childPath(std::string_view parent, std::string_view name);
+/// The same in place of the parent's path.
+void makeChildPath(std::string& path, std::string_view name);
 
 } // namespace pallax
