@@ -44,6 +44,7 @@ public:
 
 private:
     static constexpr std::size_t kUsualEntries = 4;
+    static constexpr std::size_t kUsualElements = 8;
 
     bool take(std::string_view expected) {
         const bool found = _rest.starts_with(expected);
@@ -120,6 +121,7 @@ private:
             return std::nullopt;
         }
         Array elements;
+        elements.reserve(kUsualElements);
         for (skipSpaces(); !take("</array>"); skipSpaces()) {
             auto element = value(depth + 1);
             if (!element) {
