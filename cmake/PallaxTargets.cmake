@@ -26,10 +26,6 @@ if(PALLAX_SANITIZE)
 endif()
 # An index past the end of a standard container ends a test run, not only under sanitizers.
 target_compile_definitions(pallax_options INTERFACE "$<$<CONFIG:Debug>:_GLIBCXX_ASSERTIONS>")
-if(CMAKE_UNITY_BUILD)
-    # Of joined sources, a name in one hides that of another; each alone is checked elsewhere.
-    target_compile_options(pallax_options INTERFACE -Wno-shadow)
-endif()
 if(PALLAX_COVERAGE)
     # Counters only in what is measured: those of the libraries that tests and templates pull in
     # would double the build. Every process adds to one of four files for its executable.

@@ -15,12 +15,12 @@ namespace {
 /// Of numbers of 32 bits, low bytes first.
 template <std::size_t kCount>
 void append(ByteBuffer& out, const std::array<std::uint32_t, kCount>& numbers) {
-    constexpr unsigned kBits = 32;
-    constexpr unsigned kBitsPerByte = 8;
+    constexpr unsigned kNumberBits = 32;
+    constexpr unsigned kByteBits = 8;
     std::array<std::uint8_t, kCount * sizeof(std::uint32_t)> bytes{};
     auto place = bytes.begin();
     for (const std::uint32_t number : numbers) {
-        for (unsigned shift = 0; shift < kBits; shift += kBitsPerByte) {
+        for (unsigned shift = 0; shift < kNumberBits; shift += kByteBits) {
             *place++ = static_cast<std::uint8_t>(number >> shift);
         }
     }

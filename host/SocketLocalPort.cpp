@@ -20,23 +20,22 @@ constexpr std::size_t kChunkSize = std::size_t{64} << 10U;
 /// Before the next try after descriptors or memory have run out.
 constexpr std::chrono::milliseconds kAcceptRetryDelay{100};
 
-/// Which file a path leads to, so that only our own is removed.
-struct FileIdentity {
-    dev_t device = 0;
-    ino_t inode = 0;
-    friend bool operator==(const FileIdentity&, const FileIdentity&) = default;
-};
-
-FileIdentity identityOf(const std::string& path) {
-    struct stat status {};
-    return ::lstat(path.c_str(), &status) == 0 ? FileIdentity{status.st_dev, status.st_ino}
-                                               : FileIdentity{};
-}
-
 } // namespace
 
 /// What outlives the port while one of its blocks runs.
 struct SocketLocalPort::State : std::enable_shared_from_this<State> {
+    /// Which file a path leads to, so that only our own is removed.
+    struct FileIdentity {
+        dev_t device = 0;
+        ino_t inode = 0;
+        friend bool operator==(const FileIdentity&, const FileIdentity&) = default;
+    };
+    static FileIdentity identityOf(const std::string& path) {
+        struct stat status {};
+        return ::lstat(path.c_str(), &status) == 0 ? FileIdentity{status.st_dev, status.st_ino}
+                                                   : FileIdentity{};
+    }
+
     explicit State(Setup from)
         : setup(std::move(from)), identity(identityOf(setup.path)),
           arrivals(setup.queue, setup.listener.number()) {}

@@ -82,15 +82,15 @@ std::string formatText(std::string_view format, std::initializer_list<FormatArgu
 }
 
 std::string dumpOf(const std::uint8_t* data, std::size_t size) {
-    constexpr std::string_view kDigits = "0123456789abcdef";
+    constexpr std::string_view kHexDigits = "0123456789abcdef";
     constexpr std::size_t kGroup = 4;
     std::string out = "<";
     for (std::size_t at = 0; at < size; ++at) {
         if (at != 0 && at % kGroup == 0) {
             out += ' ';
         }
-        out += kDigits[data[at] >> 4U];
-        out += kDigits[data[at] & 0x0FU];
+        out += kHexDigits[data[at] >> 4U];
+        out += kHexDigits[data[at] & 0x0FU];
     }
     out += '>';
     return out;

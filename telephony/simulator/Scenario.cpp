@@ -47,7 +47,7 @@ void Scenario::move() {
 }
 
 void Scenario::chooseLayer() {
-    constexpr int kPatience = 6; // steps for which a threshold has to be passed
+    constexpr int kLayerPatience = 6; // steps for which a threshold has to be passed
     _hasNewLayer = false;
     if (!_fallback || !_activity.isRegistered()) {
         return;
@@ -56,7 +56,7 @@ void Scenario::chooseLayer() {
     const bool wantsChange =
         _servingLayer == 0 ? level_dbm < _fallback->leave_dbm : level_dbm > _fallback->return_dbm;
     _layerPatience = wantsChange ? _layerPatience + 1 : 0;
-    if (_layerPatience >= kPatience) {
+    if (_layerPatience >= kLayerPatience) {
         _servingLayer = _servingLayer == 0 ? 1 : 0;
         _layerPatience = 0;
         _hasNewLayer = true;

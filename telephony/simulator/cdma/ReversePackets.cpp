@@ -10,11 +10,11 @@ namespace pallax::cdma {
 void encode(const ReversePackets& packets, ByteBuffer& out) {
     constexpr std::size_t kSmallOffset = 114;
     constexpr std::size_t kLargeOffset = 210;
-    constexpr std::size_t kLength = 1750;
+    constexpr std::size_t kWholeLength = 1750;
     RecordWriter record(out, 0x127E);
     record.u8(0).u32(packets.sequence);
     record.padTo(kSmallOffset).u32(packets.of1024);
-    record.padTo(kLargeOffset).u32(packets.of4096).padTo(kLength);
+    record.padTo(kLargeOffset).u32(packets.of4096).padTo(kWholeLength);
 }
 
 } // namespace pallax::cdma

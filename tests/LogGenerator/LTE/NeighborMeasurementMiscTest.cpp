@@ -12,13 +12,13 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-constexpr auto kPackedFields = std::to_array<PackedField>({
+constexpr auto kPackedMeasurements = std::to_array<PackedField>({
     {"Version", 13, 0, 8, plain},
     {"E-ARFCN", 17, 0, 16, plain},
     {"Qrxlevmin", 19, 0, 6, doubleDbm},
 });
 
-Record filled(unsigned byte) {
+Record measurementOf(unsigned byte) {
     return Record(0xB180).append({byte, byte, byte, byte, byte, byte, byte, byte});
 }
 
@@ -30,11 +30,11 @@ TEST(NeighborMeasurementMisc, SubscribesToTheIdleModeMeasurement) {
 
 TEST(NeighborMeasurementMisc, ShowsBothEndsOfItsRangesInTheOrderOfTheKeys) {
     RecordFixture<NeighborMeasurementMisc> fixture;
-    fixture.feed(filled(0));
+    fixture.feed(measurementOf(0));
     EXPECT_EQ(fixture.lines, (Lines{{4, "Neighbor Measurements"}}));
     expectInOrder(fixture.section(),
                   Dictionary{{"Version", "0"}, {"E-ARFCN", "0"}, {"Qrxlevmin", "-140 dBm"}});
-    fixture.feed(filled(0xFF));
+    fixture.feed(measurementOf(0xFF));
     expectInOrder(fixture.section(), Dictionary{{"Version", "255"},
                                                 {"E-ARFCN", "65535"},
                                                 {"Qrxlevmin", "-14 dBm"}}); // 63 x 2 - 140
@@ -45,14 +45,15 @@ TEST(NeighborMeasurementMisc, ShowsBothEndsOfItsRangesInTheOrderOfTheKeys) {
 TEST(NeighborMeasurementMisc, OneBitAtATimeChangesItsKeyAlone) {
     for (std::size_t byte = 13; byte < 21; ++byte) {
         for (unsigned bit = 0; bit < 8; ++bit) {
-            expectInOrder(sectionAfter<NeighborMeasurementMisc>(filled(0).at(byte, 1U << bit)),
-                          withOneBit(kPackedFields, byte, bit));
+            expectInOrder(
+                sectionAfter<NeighborMeasurementMisc>(measurementOf(0).at(byte, 1U << bit)),
+                withOneBit(kPackedMeasurements, byte, bit));
         }
     }
 }
 
 TEST(NeighborMeasurementMisc, APacketOf20BytesChangesNothing) {
-    cutAtEveryLength<NeighborMeasurementMisc>(filled(0xFF), 21);
+    cutAtEveryLength<NeighborMeasurementMisc>(measurementOf(0xFF), 21);
     RecordFixture<NeighborMeasurementMisc> fixture;
     fixture.feed(Record(0xB180).padTo(20));
     EXPECT_EQ(fixture.lines, (Lines{{4, "Neighbor Measurements"}}))

@@ -4,6 +4,7 @@
 #include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
+#include <rapidcheck.h>
 
 namespace pallax {
 namespace {
@@ -11,15 +12,15 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-constexpr std::size_t kEntriesStart = 21;
+constexpr std::size_t kCandidatesStart = 21;
 
-Record head(unsigned count) {
+Record candidatesHead(unsigned count) {
     return Record(0xB186).u8(1).u8(0).u16(1850).u16(274).u16(count);
 }
 
 /// One candidate of that technology over eight bytes that are all different.
 Record oneCandidate(unsigned technology) {
-    return head(1)
+    return candidatesHead(1)
         .u16(0x0102)
         .u16(technology)
         .append({0x11, 0x12, 0x13, 0x94, 0x15, 0x16, 0x17, 0x18});
@@ -85,7 +86,7 @@ TEST(ReselectionCandidatesList, AnyOtherTechnologyShowsTwoQuestionMarksAndNothin
 TEST(ReselectionCandidatesList, TheCellIDIsBits7To15OfItsWord) {
     const auto cellId = [](unsigned low, unsigned high) {
         RecordFixture<ReselectionCandidatesList> fixture;
-        fixture.feed(head(1).u32(0).u16(1850).u8(low).u8(high));
+        fixture.feed(candidatesHead(1).u32(0).u16(1850).u8(low).u8(high));
         return fixture.list().at(0).dictionary()->find("Cell ID")->displayNumber()->integer();
     };
     EXPECT_EQ(cellId(0x00, 0x80), 256);
@@ -96,7 +97,7 @@ TEST(ReselectionCandidatesList, TheCellIDIsBits7To15OfItsWord) {
 
 TEST(ReselectionCandidatesList, EntriesStand4BytesApartSoThatTheirTechnologyDataOverlaps) {
     // Entry 0 (LTE) stands at 21, entry 1 (GERAN) at 25.
-    const Record record = head(2)
+    const Record record = candidatesHead(2)
                               .u16(7)
                               .u16(0)
                               .u16(1850) // entry 0: E ARFCN; entry 1: priority
@@ -122,12 +123,12 @@ TEST(ReselectionCandidatesList, AnEntryIsWholeWhenTheBytesReadForItsTechnologyLi
                                                        {3, 12}, {4, 12}, {5, 4}};
     for (const auto& [technology, needed] : bytesRead) {
         const ByteBuffer bytes = oneCandidate(technology).bytes();
-        for (std::size_t length = kEntriesStart; length <= bytes.size(); ++length) {
+        for (std::size_t length = kCandidatesStart; length <= bytes.size(); ++length) {
             RecordFixture<ReselectionCandidatesList> fixture;
             fixture.list() = Array{"what was shown before"};
             fixture.feed(
                 ByteBuffer(bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(length)));
-            EXPECT_EQ(fixture.list().size(), length >= kEntriesStart + needed ? 1 : 0)
+            EXPECT_EQ(fixture.list().size(), length >= kCandidatesStart + needed ? 1 : 0)
                 << "technology " << technology << " cut at " << length;
         }
     }
@@ -136,10 +137,10 @@ TEST(ReselectionCandidatesList, AnEntryIsWholeWhenTheBytesReadForItsTechnologyLi
 TEST(ReselectionCandidatesList, TheListStopsAtTheFirstEntryThatIsNotWhole) {
     // The third entry is whole, but the CDMA entry before it is not, and so neither is shown.
     RecordFixture<ReselectionCandidatesList> fixture;
-    fixture.feed(head(3).u16(1).u16(9).u16(2).u16(3).u16(4).u16(9));
+    fixture.feed(candidatesHead(3).u16(1).u16(9).u16(2).u16(3).u16(4).u16(9));
     EXPECT_EQ(fixture.list(),
               (Array{Dictionary{{"Candidate Priority", "1"}, {"Candidate RAT Type", "??"}}}));
-    fixture.feed(head(0xFFFF).u16(1).u16(9).u16(2).u16(9).u8(3));
+    fixture.feed(candidatesHead(0xFFFF).u16(1).u16(9).u16(2).u16(9).u8(3));
     EXPECT_EQ(fixture.list(),
               (Array{Dictionary{{"Candidate Priority", "1"}, {"Candidate RAT Type", "??"}},
                      Dictionary{{"Candidate Priority", "2"}, {"Candidate RAT Type", "??"}}}));
@@ -155,7 +156,7 @@ TEST(ReselectionCandidatesList, ACountOf0EmptiesTheListSilently) {
 
 TEST(ReselectionCandidatesList, TheCountIsAWordOf16Bits) {
     RecordFixture<ReselectionCandidatesList> fixture;
-    Record record = head(0x0102);
+    Record record = candidatesHead(0x0102);
     for (unsigned entry = 0; entry < 0x0103; ++entry) {
         record.u16(entry).u16(9);
     }
@@ -164,7 +165,7 @@ TEST(ReselectionCandidatesList, TheCountIsAWordOf16Bits) {
 }
 
 TEST(ReselectionCandidatesList, APacketOf20BytesLeavesTheListAsItWas) {
-    cutAtEveryLength<ReselectionCandidatesList>(oneCandidate(3), kEntriesStart);
+    cutAtEveryLength<ReselectionCandidatesList>(oneCandidate(3), kCandidatesStart);
     RecordFixture<ReselectionCandidatesList> fixture;
     fixture.feed(oneCandidate(9));
     const PropertyList before = fixture.snapshot();
@@ -199,7 +200,7 @@ TEST(ReselectionCandidatesList, AnyBytesKeepItsEntriesWithinItsKeys) {
     // Of any bytes, few are a technology: the same with technologies that are mostly known.
     anyRecordsKeepWithin<ReselectionCandidatesList, NothingThrown>(
         keys, codesOf<ReselectionCandidatesList>(), [](LogCode) {
-            Record record = head(*rc::gen::inRange(0U, 12U));
+            Record record = candidatesHead(*rc::gen::inRange(0U, 12U));
             for (const unsigned word :
                  *rc::gen::container<std::vector<unsigned>>(rc::gen::inRange(0U, 7U))) {
                 record.u16(word);

@@ -27,7 +27,7 @@ std::string trueOrFalse(std::uint32_t raw) {
     return raw != 0 ? "True" : "False";
 }
 
-constexpr auto kPackedFields = std::to_array<PackedField>({
+constexpr auto kPackedServingCell = std::to_array<PackedField>({
     {"Version", 13, 0, 8, plain},
     {"E-ARFCN", 17, 0, 16, plain},
     {"Physical Cell ID", 19, 0, 9, plain},
@@ -49,7 +49,7 @@ constexpr auto kPackedFields = std::to_array<PackedField>({
 });
 
 /// The record with every payload byte set to one value.
-Record filled(unsigned byte) {
+Record servingCellOf(unsigned byte) {
     Record record(0xB17F);
     for (std::size_t at = 13; at < kLength; ++at) {
         record.u8(byte);
@@ -64,7 +64,7 @@ TEST(ServingCellMeasurement, SubscribesToItsRecord) {
 }
 
 TEST(ServingCellMeasurement, AnAllZeroRecordShowsTheLowerEndsInTheOrderOfTheKeys) {
-    expectInOrder(sectionAfter<ServingCellMeasurement>(filled(0)),
+    expectInOrder(sectionAfter<ServingCellMeasurement>(servingCellOf(0)),
                   Dictionary{{"Version", "0"},
                              {"E-ARFCN", "0"},
                              {"Physical Cell ID", "0"},
@@ -86,7 +86,7 @@ TEST(ServingCellMeasurement, AnAllZeroRecordShowsTheLowerEndsInTheOrderOfTheKeys
 }
 
 TEST(ServingCellMeasurement, AnAllOneRecordShowsTheUpperEnds) {
-    expectInOrder(sectionAfter<ServingCellMeasurement>(filled(0xFF)),
+    expectInOrder(sectionAfter<ServingCellMeasurement>(servingCellOf(0xFF)),
                   Dictionary{{"Version", "255"},
                              {"E-ARFCN", "65535"},
                              {"Physical Cell ID", "511"},
@@ -110,14 +110,15 @@ TEST(ServingCellMeasurement, AnAllOneRecordShowsTheUpperEnds) {
 TEST(ServingCellMeasurement, OneBitAtATimeChangesItsKeyAlone) {
     for (std::size_t byte = 13; byte < kLength; ++byte) {
         for (unsigned bit = 0; bit < 8; ++bit) {
-            expectInOrder(sectionAfter<ServingCellMeasurement>(filled(0).at(byte, 1U << bit)),
-                          withOneBit(kPackedFields, byte, bit));
+            expectInOrder(
+                sectionAfter<ServingCellMeasurement>(servingCellOf(0).at(byte, 1U << bit)),
+                withOneBit(kPackedServingCell, byte, bit));
         }
     }
 }
 
 TEST(ServingCellMeasurement, ShowsAMeasurement) {
-    const Record record = filled(0)
+    const Record record = servingCellOf(0)
                               .at(13, 4)
                               .at(17, 0x3A)
                               .at(18, 0x07) // 1850
@@ -163,16 +164,16 @@ TEST(ServingCellMeasurement, ShowsAMeasurement) {
 
 TEST(ServingCellMeasurement, PMax64IsNotPresent) {
     RecordFixture<ServingCellMeasurement> fixture;
-    fixture.feed(filled(0).at(27, 1U << 5U)); // bit 6 of the field
+    fixture.feed(servingCellOf(0).at(27, 1U << 5U)); // bit 6 of the field
     EXPECT_EQ(fixture.text("P_Max"), "Not Present");
-    fixture.feed(filled(0).at(27, 1U << 5U).at(26, 1U << 7U));
+    fixture.feed(servingCellOf(0).at(27, 1U << 5U).at(26, 1U << 7U));
     EXPECT_EQ(fixture.text("P_Max"), "35 dBm") << "65 is a power again";
 }
 
 TEST(ServingCellMeasurement, MaxUETxPowerIsNeverNotPresent) {
     RecordFixture<ServingCellMeasurement> fixture;
     for (unsigned raw = 0; raw < 128; ++raw) { // one bit more than the field has
-        fixture.feed(filled(0).at(27, raw << 6U & 0xFFU).at(28, raw >> 2U));
+        fixture.feed(servingCellOf(0).at(27, raw << 6U & 0xFFU).at(28, raw >> 2U));
         EXPECT_EQ(fixture.text("Max UE Tx Power"),
                   std::to_string(static_cast<int>(raw % 64) - 30) + " dBm");
     }
@@ -181,7 +182,7 @@ TEST(ServingCellMeasurement, MaxUETxPowerIsNeverNotPresent) {
 TEST(ServingCellMeasurement, SIntraSearchIsShownInDBAndSNonIntraSearchInDBm) {
     RecordFixture<ServingCellMeasurement> fixture;
     const auto feed = [&fixture](unsigned raw) {
-        fixture.feed(filled(0)
+        fixture.feed(servingCellOf(0)
                          .at(30, raw << 5U & 0xFFU)
                          .at(31, raw >> 3U | (raw << 3U & 0xFFU))
                          .at(32, raw >> 5U));
@@ -200,7 +201,7 @@ TEST(ServingCellMeasurement, SIntraSearchIsShownInDBAndSNonIntraSearchInDBm) {
 }
 
 TEST(ServingCellMeasurement, APacketOf32BytesChangesNothing) {
-    cutAtEveryLength<ServingCellMeasurement>(filled(0xFF), kLength);
+    cutAtEveryLength<ServingCellMeasurement>(servingCellOf(0xFF), kLength);
     RecordFixture<ServingCellMeasurement> fixture;
     fixture.feed(Record(0xB17F).padTo(kLength - 1));
     EXPECT_EQ(fixture.lines, (Lines{{4, "Serving Cell Measurements"}}))
@@ -217,7 +218,7 @@ TEST(ServingCellMeasurement, AnyOtherCodeIsUnknownAndChangesNothing) {
 
 TEST(ServingCellMeasurement, AnyBytesKeepWithinItsKeys) {
     std::set<std::string> keys;
-    for (const PackedField& field : kPackedFields) {
+    for (const PackedField& field : kPackedServingCell) {
         keys.insert(field.key);
     }
     anyBytesKeepWithin<ServingCellMeasurement>(keys);

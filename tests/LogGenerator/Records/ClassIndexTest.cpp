@@ -3,6 +3,7 @@
 #include "tests/doubles/FakeStandardOutput.h"
 #include "tests/doubles/RecordingLog.h"
 
+#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <array>

@@ -20,9 +20,9 @@ constexpr auto kSecond = std::to_array<Field>({
 constexpr auto kGroups = std::to_array<FieldGroup>({{0x5002, 16, kFirst}, {0x5001, 15, kSecond}});
 constexpr auto kLogCodes = logCodesOf(kGroups);
 
-class Example final : public Base {
+class GroupExample final : public Base {
 public:
-    std::string_view getSectionName() const override { return "Example"; }
+    std::string_view getSectionName() const override { return "GroupExample"; }
     std::span<const LogCode> getLogCodeArray() const override { return kLogCodes; }
     void updateWithData(const LogRecord& record, LogCode logCode) override {
         showGroup(kGroups, record, logCode);
@@ -30,27 +30,28 @@ public:
 };
 
 TEST(FieldGroup, TheCodesStandInTheOrderOfTheGroups) {
-    EXPECT_EQ(RecordFixture<Example>().subscriptions(), (std::vector<LogCode>{0x5002, 0x5001}));
+    EXPECT_EQ(RecordFixture<GroupExample>().subscriptions(),
+              (std::vector<LogCode>{0x5002, 0x5001}));
 }
 
 TEST(FieldGroup, TheGroupOfTheCodeIsShownInItsOrder) {
-    expectInOrder(sectionAfter<Example>(Record(0x5001).append({1, 2})),
+    expectInOrder(sectionAfter<GroupExample>(Record(0x5001).append({1, 2})),
                   Dictionary{{"Beta", "2"}, {"Alpha", "1"}});
-    expectInOrder(sectionAfter<Example>(Record(0x5002).append({1, 2, 3})),
+    expectInOrder(sectionAfter<GroupExample>(Record(0x5002).append({1, 2, 3})),
                   Dictionary{{"First", "1"}});
 }
 
 TEST(FieldGroup, EachGroupAsksItsOwnMinimumAndAShorterRecordChangesNothingSilently) {
-    cutAtEveryLength<Example>(Record(0x5002).append({1, 2, 3}), 16);
-    cutAtEveryLength<Example>(Record(0x5001).append({1, 2}), 15);
-    RecordFixture<Example> fixture;
+    cutAtEveryLength<GroupExample>(Record(0x5002).append({1, 2, 3}), 16);
+    cutAtEveryLength<GroupExample>(Record(0x5001).append({1, 2}), 15);
+    RecordFixture<GroupExample> fixture;
     fixture.feed(Record(0x5002).append({1, 2}));
     EXPECT_EQ(fixture.lines, Lines());
     EXPECT_TRUE(fixture.keys().empty());
 }
 
 TEST(FieldGroup, ACodeWithoutAGroupIsUnknownWhateverTheLength) {
-    RecordFixture<Example> fixture;
+    RecordFixture<GroupExample> fixture;
     fixture.feed(Record(0x5003));
     EXPECT_EQ(fixture.lines, (Lines{{3, "Received an unknown log message: 20483"}}));
     EXPECT_TRUE(fixture.keys().empty());

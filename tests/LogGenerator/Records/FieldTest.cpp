@@ -61,12 +61,12 @@ TEST(Conversion, AnExceptionalRawValueShowsItsText) {
 }
 
 TEST(Field, KeysAreSetInTheOrderOfTheTable) {
-    constexpr auto kFields = std::to_array<Field>({
+    constexpr auto kManyFields = std::to_array<Field>({
         {"B", u8At(1), Conversion::number()},
         {"A", u8At(0), Conversion::label(kLabels)},
     });
     const ByteBuffer bytes = {1, 9};
-    doubles::expectInOrder(entryOf(kFields, LogRecord(bytes)),
+    doubles::expectInOrder(entryOf(kManyFields, LogRecord(bytes)),
                            Dictionary{{"B", "9"}, {"A", "One"}});
 }
 

@@ -12,11 +12,11 @@ namespace {
 
 using doubles::sameInOrder;
 
-constexpr auto kFields = std::to_array<Field>({
+constexpr auto kCellFields = std::to_array<Field>({
     {"First", u8At(0), Conversion::number()},
     {"Second", u8At(1), Conversion::number()},
 });
-constexpr auto kFirstField = std::to_array<Field>({kFields[0]});
+constexpr auto kFirstField = std::to_array<Field>({kCellFields[0]});
 
 class Cells : public Base {
 public:
@@ -29,7 +29,7 @@ public:
                         if (entry.u8(1) == 0) {
                             fillEntry(cell, kFirstField, entry);
                         } else {
-                            fillEntry(cell, kFields, entry);
+                            fillEntry(cell, kCellFields, entry);
                         }
                     });
     }

@@ -6,10 +6,10 @@
 namespace pallax {
 namespace {
 
-const ByteBuffer kBytes = {0x01, 0x82, 0x03, 0xFF};
+const ByteBuffer kFourBytes = {0x01, 0x82, 0x03, 0xFF};
 
 TEST(LogRecord, ReadsLittleEndianNumbersByOffset) {
-    const LogRecord record(kBytes);
+    const LogRecord record(kFourBytes);
     EXPECT_EQ(record.u8(1), 0x82);
     EXPECT_EQ(record.u16(0), 0x8201);
     EXPECT_EQ(record.u32(0), 0xFF038201U);
@@ -17,7 +17,7 @@ TEST(LogRecord, ReadsLittleEndianNumbersByOffset) {
 }
 
 TEST(LogRecord, BytesPastTheEndReadAsZero) {
-    const LogRecord record(kBytes);
+    const LogRecord record(kFourBytes);
     EXPECT_EQ(record.u8(4), 0);
     EXPECT_EQ(record.u16(3), 0x00FF);
     EXPECT_EQ(record.u32(2), 0x0000FF03U);
@@ -26,7 +26,7 @@ TEST(LogRecord, BytesPastTheEndReadAsZero) {
 }
 
 TEST(LogRecord, PositionsReadSignedUnsignedAndBigEndian) {
-    const LogRecord record(kBytes);
+    const LogRecord record(kFourBytes);
     EXPECT_EQ(record.read(u8At(1)), 0x82);
     EXPECT_EQ(record.read(s8At(1)), -126);
     EXPECT_EQ(record.read(u16At(0)), 0x8201);
@@ -45,7 +45,7 @@ TEST(LogRecord, AFieldThatCrossesBytesTakesItsLowBitsFromTheLowerByte) {
 }
 
 TEST(LogRecord, HasAsksWhetherEveryByteBelowTheEndLiesInside) {
-    const LogRecord record(kBytes);
+    const LogRecord record(kFourBytes);
     EXPECT_TRUE(record.has(4));
     EXPECT_FALSE(record.has(5));
     EXPECT_TRUE(LogRecord().has(0));
@@ -54,9 +54,9 @@ TEST(LogRecord, HasAsksWhetherEveryByteBelowTheEndLiesInside) {
 TEST(LogRecord, PayloadFollowsTheHeader) {
     const ByteBuffer bytes(15, 7);
     EXPECT_EQ(LogRecord(bytes).payload().size(), 2U);
-    EXPECT_TRUE(LogRecord(kBytes).payload().empty());
-    EXPECT_EQ(LogRecord(kBytes).from(2).u8(0), 0x03);
-    EXPECT_EQ(LogRecord(kBytes).from(9).length(), 0U);
+    EXPECT_TRUE(LogRecord(kFourBytes).payload().empty());
+    EXPECT_EQ(LogRecord(kFourBytes).from(2).u8(0), 0x03);
+    EXPECT_EQ(LogRecord(kFourBytes).from(9).length(), 0U);
 }
 
 TEST(LogRecordProperty, AnyBitFieldEqualsItsBitsOneByOne) {

@@ -4,12 +4,13 @@
 #include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
+#include <rapidcheck.h>
 
 namespace pallax {
 namespace {
 
 using namespace doubles; // NOLINT: the vocabulary of these tests
-using Fixture = RecordFixture<CCTRCHSIRMeasurement>;
+using SirFixture = RecordFixture<CCTRCHSIRMeasurement>;
 using Lines = std::vector<RecordingLog::Line>;
 
 constexpr std::size_t entriesStart(unsigned transportChannels) {
@@ -28,14 +29,14 @@ Record channels(unsigned transport, unsigned composite) {
 }
 
 TEST(CCTRCHSIRMeasurement, OwnsCCTRCHSIRAndSubscribesTo0xD00C) {
-    const Fixture fixture;
+    const SirFixture fixture;
     EXPECT_EQ(fixture.subscriptions(), (std::vector<LogCode>{0xD00C}));
     EXPECT_EQ(CCTRCHSIRMeasurement().getSectionName(), "CCTRCH SIR");
     EXPECT_EQ(CCTRCHSIRMeasurement().sectionKind(), SectionKind::List);
 }
 
 TEST(CCTRCHSIRMeasurement, ShowsEveryChannelWithItsKeysInOrderAndSixRatios) {
-    Fixture fixture;
+    SirFixture fixture;
     fixture.feed(
         channels(0, 2).append({1, 2, 10, 11, 12, 13, 14, 255}).append({255, 6, 0, 0, 0, 0, 0, 1}));
     EXPECT_EQ(fixture.lines, (Lines{{4, "CCTRCH SIR Measurement"}}));
@@ -51,7 +52,7 @@ TEST(CCTRCHSIRMeasurement, ShowsEveryChannelWithItsKeysInOrderAndSixRatios) {
 
 TEST(CCTRCHSIRMeasurement, WithTwoTransportChannelsTheEntryIsReadFromByte357) {
     Record record = Record(0xD00C).padTo(365).at(14, 0x80).at(15, 0x10).at(357, 42);
-    Fixture fixture;
+    SirFixture fixture;
     fixture.feed(record);
     ASSERT_EQ(fixture.list().size(), 1U);
     EXPECT_EQ(*fixture.list()[0].dictionary()->find("CCTRCH ID"), PropertyList("42"));
@@ -60,7 +61,7 @@ TEST(CCTRCHSIRMeasurement, WithTwoTransportChannelsTheEntryIsReadFromByte357) {
 TEST(CCTRCHSIRMeasurement, TheEntriesBeginAt289Plus34TimesTheTransportChannels) {
     for (unsigned transport = 0; transport < 64; ++transport) {
         const Record record = channels(transport, 1).append({7, 8, 1, 2, 3, 4, 5, 6});
-        Fixture fixture;
+        SirFixture fixture;
         fixture.feed(record);
         EXPECT_EQ(
             fixture.section(),
@@ -71,7 +72,7 @@ TEST(CCTRCHSIRMeasurement, TheEntriesBeginAt289Plus34TimesTheTransportChannels) 
 }
 
 TEST(CCTRCHSIRMeasurement, TheCountIsTheUpperFourBitsOfByte15) {
-    Fixture fixture;
+    SirFixture fixture;
     for (unsigned composite = 0; composite < 16; ++composite) {
         fixture.feed(channels(0, composite).padTo(entriesStart(0) + 15 * 8));
         EXPECT_EQ(fixture.list().size(), composite);
@@ -83,14 +84,14 @@ TEST(CCTRCHSIRMeasurement, TheCountIsTheUpperFourBitsOfByte15) {
 }
 
 TEST(CCTRCHSIRMeasurement, NoChannelsEmptyTheList) {
-    Fixture fixture;
+    SirFixture fixture;
     fixture.list() = Array{"what was shown before"};
     fixture.feed(Record(0xD00C).padTo(17));
     EXPECT_TRUE(fixture.list().empty());
 }
 
 TEST(CCTRCHSIRMeasurement, AShortPacketOrAnotherCodeChangesNothingSilently) {
-    Fixture fixture;
+    SirFixture fixture;
     fixture.list() = Array{"what was shown before"};
     for (const Record& record : {Record(0xD00C).padTo(16), Record(0xD00E).padTo(400)}) {
         fixture.feed(record);
@@ -103,7 +104,7 @@ TEST(CCTRCHSIRMeasurement, AShortPacketOrAnotherCodeChangesNothingSilently) {
 TEST(CCTRCHSIRMeasurement, TheListStopsAtTheFirstChannelThatIsNotWhole) {
     const ByteBuffer bytes = channels(1, 15).padTo(entriesStart(1) + 20).bytes();
     for (std::size_t length = 17; length <= bytes.size(); ++length) {
-        Fixture fixture;
+        SirFixture fixture;
         fixture.feed(
             ByteBuffer(bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(length)));
         const std::size_t behind = length < entriesStart(1) ? 0 : length - entriesStart(1);

@@ -5,12 +5,13 @@
 #include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
+#include <rapidcheck.h>
 
 namespace pallax {
 namespace {
 
 using namespace doubles; // NOLINT: the vocabulary of these tests
-using Fixture = RecordFixture<GSMNeighbhorMeasurements>;
+using GsmNeighborFixture = RecordFixture<GSMNeighbhorMeasurements>;
 using Lines = std::vector<RecordingLog::Line>;
 
 Record neighbours(unsigned count) {
@@ -24,7 +25,7 @@ PropertyList onlyCell(std::initializer_list<unsigned> entry) {
 }
 
 TEST(GSMNeighbhorMeasurements, OwnsTheGSMNeighborCellListAndSubscribesTo0xD00E) {
-    const Fixture fixture;
+    const GsmNeighborFixture fixture;
     EXPECT_EQ(fixture.subscriptions(), (std::vector<LogCode>{0xD00E}));
     EXPECT_EQ(GSMNeighbhorMeasurements().getSectionName(), "GSM Neighbor Cell List");
     EXPECT_EQ(GSMNeighbhorMeasurements().sectionKind(), SectionKind::List);
@@ -35,7 +36,7 @@ TEST(GSMNeighbhorMeasurements, TheListIsBuiltAndDroppedSoThatTheSectionIsEmptied
                               .append({0x2A, 0xC1, 3, 5, 0x56, 0, 0xB0, 0xFF})
                               .append({0x2B, 0x81, 4, 6, 0x57, 0, 0xB1, 0xFF});
     EXPECT_EQ(GSMNeighbhorMeasurements::cellsOf(LogRecord(record.bytes())).size(), 2U);
-    Fixture fixture;
+    GsmNeighborFixture fixture;
     fixture.list() = Array{"what was shown before"};
     fixture.feed(record);
     EXPECT_EQ(fixture.lines, (Lines{{4, "GSM Neighbor Cell List"}}));
@@ -88,7 +89,7 @@ TEST(GSMNeighbhorMeasurements, CellsAreReadUpToTheFirstThatIsNotWhole) {
 }
 
 TEST(GSMNeighbhorMeasurements, AShortPacketOrAnotherCodeChangesNothingSilently) {
-    Fixture fixture;
+    GsmNeighborFixture fixture;
     fixture.list() = Array{"what was shown before"};
     for (const Record& record : {Record(0xD00E).padTo(16), Record(0xD00A).padTo(400)}) {
         fixture.feed(record);

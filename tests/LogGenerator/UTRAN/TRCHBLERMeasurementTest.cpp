@@ -10,7 +10,7 @@ namespace pallax {
 namespace {
 
 using namespace doubles; // NOLINT: the vocabulary of these tests
-using Fixture = RecordFixture<TRCHBLERMeasurement>;
+using BlerFixture = RecordFixture<TRCHBLERMeasurement>;
 using Lines = std::vector<RecordingLog::Line>;
 
 Record counts(unsigned byte14, unsigned byte15) {
@@ -18,14 +18,14 @@ Record counts(unsigned byte14, unsigned byte15) {
 }
 
 TEST(TRCHBLERMeasurement, OwnsTRCHBLERAndSubscribesTo0xD00C) {
-    const Fixture fixture;
+    const BlerFixture fixture;
     EXPECT_EQ(fixture.subscriptions(), (std::vector<LogCode>{0xD00C}));
     EXPECT_EQ(TRCHBLERMeasurement().getSectionName(), "TRCH BLER");
     EXPECT_EQ(TRCHBLERMeasurement().sectionKind(), SectionKind::List);
 }
 
 TEST(TRCHBLERMeasurement, Bytes0x80And0x00GiveTwoChannelsWithTheirKeysInOrder) {
-    Fixture fixture;
+    BlerFixture fixture;
     fixture.feed(counts(0x80, 0x00).append({1, 12, 255, 254, 3, 3}));
     ASSERT_EQ(fixture.list().size(), 2U);
     expectInOrder(fixture.list()[0], Dictionary{{"TRCH ID", "1"}, {"TRCH BLER Measurement", "12"}});
@@ -34,7 +34,7 @@ TEST(TRCHBLERMeasurement, Bytes0x80And0x00GiveTwoChannelsWithTheirKeysInOrder) {
 }
 
 TEST(TRCHBLERMeasurement, ItsTraceLineIsANoticeOfPriority5) {
-    Fixture fixture;
+    BlerFixture fixture;
     for (const Record& record : {counts(0x40, 0).padTo(19), counts(0, 0), Record(0xD00C)}) {
         fixture.feed(record);
         EXPECT_EQ(fixture.lines, (Lines{{5, "TRCH BLER Measurement"}}));
@@ -42,7 +42,7 @@ TEST(TRCHBLERMeasurement, ItsTraceLineIsANoticeOfPriority5) {
 }
 
 TEST(TRCHBLERMeasurement, TheCountIsBits6To11OfTheWordAtByte14) {
-    Fixture fixture;
+    BlerFixture fixture;
     const auto shown = [&fixture](unsigned byte14, unsigned byte15) {
         fixture.feed(counts(byte14, byte15).padTo(17 + 2 * 63));
         return fixture.list().size();
@@ -57,14 +57,14 @@ TEST(TRCHBLERMeasurement, TheCountIsBits6To11OfTheWordAtByte14) {
 }
 
 TEST(TRCHBLERMeasurement, NoChannelsEmptyTheList) {
-    Fixture fixture;
+    BlerFixture fixture;
     fixture.list() = Array{"what was shown before"};
     fixture.feed(counts(0, 0));
     EXPECT_TRUE(fixture.list().empty());
 }
 
 TEST(TRCHBLERMeasurement, AShortPacketOrAnotherCodeChangesNothingSilently) {
-    Fixture fixture;
+    BlerFixture fixture;
     fixture.list() = Array{"what was shown before"};
     for (const Record& record : {Record(0xD00C).padTo(16), Record(0xD00E).padTo(400)}) {
         fixture.feed(record);
@@ -77,7 +77,7 @@ TEST(TRCHBLERMeasurement, AShortPacketOrAnotherCodeChangesNothingSilently) {
 TEST(TRCHBLERMeasurement, TheListStopsAtTheFirstChannelThatIsNotWhole) {
     const ByteBuffer bytes = counts(0xC0, 0x0F).padTo(17 + 9).bytes();
     for (std::size_t length = 17; length <= bytes.size(); ++length) {
-        Fixture fixture;
+        BlerFixture fixture;
         fixture.feed(
             ByteBuffer(bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(length)));
         EXPECT_EQ(fixture.list().size(), (length - 17) / 2) << "cut at " << length;

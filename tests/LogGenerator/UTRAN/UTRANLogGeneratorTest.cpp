@@ -44,15 +44,16 @@ std::vector<std::string> askedFor(std::vector<std::string> paths) {
 }
 
 TEST(UTRANLogGenerator, TheNameIsThatOfTheFirstPathThatContainsUTRANInAnyCase) {
-    using Names = std::vector<std::string>;
-    EXPECT_EQ(askedFor({"a/UTRAN.plist"}), Names{"UTRAN"});
-    EXPECT_EQ(askedFor({"a/utran_v2.plist"}), Names{"utran_v2"});
+    using TemplateNames = std::vector<std::string>;
+    EXPECT_EQ(askedFor({"a/UTRAN.plist"}), TemplateNames{"UTRAN"});
+    EXPECT_EQ(askedFor({"a/utran_v2.plist"}), TemplateNames{"utran_v2"});
     EXPECT_EQ(askedFor({"a/LTE.plist", "a/My.uTrAn.v3.plist", "a/UTRAN.plist"}),
-              Names{"My.uTrAn.v3"});
-    EXPECT_EQ(askedFor({"a/EUTRANCELL.plist"}), Names{"EUTRANCELL"}) << "anywhere in the name";
-    EXPECT_EQ(askedFor({"a/utran/Other.plist", "b/UTRAN.plist"}), Names{"Other"})
+              TemplateNames{"My.uTrAn.v3"});
+    EXPECT_EQ(askedFor({"a/EUTRANCELL.plist"}), TemplateNames{"EUTRANCELL"})
+        << "anywhere in the name";
+    EXPECT_EQ(askedFor({"a/utran/Other.plist", "b/UTRAN.plist"}), TemplateNames{"Other"})
         << "anywhere in the path";
-    EXPECT_EQ(askedFor({"UTRAN"}), Names{"UTRAN"}) << "without a folder and an extension";
+    EXPECT_EQ(askedFor({"UTRAN"}), TemplateNames{"UTRAN"}) << "without a folder and an extension";
 }
 
 TEST(UTRANLogGenerator, NoPathOrNoneThatContainsUTRANAsksForNothing) {

@@ -9,7 +9,7 @@ namespace pallax {
 namespace {
 
 using namespace doubles; // NOLINT: the vocabulary of these tests
-using Fixture = RecordFixture<UTRANNeighbhorMeasurements>;
+using UtranNeighborFixture = RecordFixture<UTRANNeighbhorMeasurements>;
 using Lines = std::vector<RecordingLog::Line>;
 
 constexpr std::size_t kEntries = 168;
@@ -35,7 +35,7 @@ Record neighbours(const std::vector<std::uint32_t>& cells) {
 }
 
 std::string shown(std::uint32_t cell, std::string_view key) {
-    Fixture fixture;
+    UtranNeighborFixture fixture;
     fixture.feed(neighbours({cell}));
     if (fixture.list().size() != 1) {
         return "(no single cell)";
@@ -45,14 +45,14 @@ std::string shown(std::uint32_t cell, std::string_view key) {
 }
 
 TEST(UTRANNeighbhorMeasurements, OwnsTheNeighborCellListAndSubscribesTo0xD00A) {
-    const Fixture fixture;
+    const UtranNeighborFixture fixture;
     EXPECT_EQ(fixture.subscriptions(), (std::vector<LogCode>{0xD00A}));
     EXPECT_EQ(UTRANNeighbhorMeasurements().getSectionName(), "Neighbor Cell List");
     EXPECT_EQ(UTRANNeighbhorMeasurements().sectionKind(), SectionKind::List);
 }
 
 TEST(UTRANNeighbhorMeasurements, ShowsEveryCellWithItsKeysInOrder) {
-    Fixture fixture;
+    UtranNeighborFixture fixture;
     fixture.feed(neighbours({packed(10713, 97, 128, 1, 1), packed(10688, 5, 255, 0, 0)}));
     EXPECT_EQ(fixture.lines, (Lines{{4, "NeighbhorMeasurements List"}}));
     ASSERT_EQ(fixture.list().size(), 2U);
@@ -71,7 +71,7 @@ TEST(UTRANNeighbhorMeasurements, ShowsEveryCellWithItsKeysInOrder) {
 TEST(UTRANNeighbhorMeasurements, Byte16Of0x06GivesThreeEntriesAtBytes168And184And200) {
     Record record(0xD00A);
     record.padTo(204).at(16, 0x06).at(168, 1).at(184, 2).at(200, 3);
-    Fixture fixture;
+    UtranNeighborFixture fixture;
     fixture.feed(record);
     ASSERT_EQ(fixture.list().size(), 3U);
     for (std::size_t index = 0; index < 3; ++index) {
@@ -83,7 +83,7 @@ TEST(UTRANNeighbhorMeasurements, Byte16Of0x06GivesThreeEntriesAtBytes168And184An
 TEST(UTRANNeighbhorMeasurements, TheCountIsTheUpperSevenBitsOfByte16) {
     Record record(0xD00A);
     record.padTo(kEntries + 127 * kStride);
-    Fixture fixture;
+    UtranNeighborFixture fixture;
     for (unsigned value = 0; value < 256; ++value) {
         fixture.feed(record.at(16, value));
         EXPECT_EQ(fixture.list().size(), value / 2);
@@ -115,14 +115,14 @@ TEST(UTRANNeighbhorMeasurements, TheStatusIsAbsentFor3) {
 }
 
 TEST(UTRANNeighbhorMeasurements, ACountOf0EmptiesTheListAndAPacketOf21BytesIsEnough) {
-    Fixture fixture;
+    UtranNeighborFixture fixture;
     fixture.list() = Array{"what was shown before"};
     fixture.feed(Record(0xD00A).padTo(21));
     EXPECT_TRUE(fixture.list().empty());
 }
 
 TEST(UTRANNeighbhorMeasurements, AShortPacketOrAnotherCodeChangesNothingSilently) {
-    Fixture fixture;
+    UtranNeighborFixture fixture;
     fixture.list() = Array{"what was shown before"};
     for (const Record& record : {Record(0xD00A).padTo(20), Record(0xD00E).padTo(400)}) {
         fixture.feed(record);
@@ -135,7 +135,7 @@ TEST(UTRANNeighbhorMeasurements, AShortPacketOrAnotherCodeChangesNothingSilently
 TEST(UTRANNeighbhorMeasurements, TheListStopsAtTheFirstCellWhoseFourBytesAreNotWhole) {
     const ByteBuffer bytes = neighbours({1, 2, 3}).bytes();
     for (std::size_t length = 21; length <= bytes.size(); ++length) {
-        Fixture fixture;
+        UtranNeighborFixture fixture;
         fixture.feed(
             ByteBuffer(bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(length)));
         const std::size_t whole = length < kEntries + 4 ? 0 : (length - kEntries - 4) / kStride + 1;

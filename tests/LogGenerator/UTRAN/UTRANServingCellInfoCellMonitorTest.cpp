@@ -9,7 +9,7 @@ namespace pallax {
 namespace {
 
 using namespace doubles; // NOLINT: the vocabulary of these tests
-using Fixture = RecordFixture<UTRANServingCellInfo>;
+using CellMonitorFixture = RecordFixture<UTRANServingCellInfo>;
 using Lines = std::vector<RecordingLog::Line>;
 
 PropertyList serving(std::int64_t first) {
@@ -29,7 +29,7 @@ Dictionary shownOf(int first) {
 }
 
 TEST(UTRANServingCellInfoCellMonitor, ShowsTheServingCellWithOneUARFCNUnderTwoKeys) {
-    Fixture fixture;
+    CellMonitorFixture fixture;
     fixture.feed(cellsRecord({serving(100)}));
     EXPECT_EQ(fixture.lines, (Lines{{4, "Serving Cell Info"}}));
     expectInOrder(fixture.section(), shownOf(100));
@@ -38,7 +38,7 @@ TEST(UTRANServingCellInfoCellMonitor, ShowsTheServingCellWithOneUARFCNUnderTwoKe
 }
 
 TEST(UTRANServingCellInfoCellMonitor, TheScanDoesNotStopAtTheFirstMatchSoTheLastCellStays) {
-    Fixture fixture;
+    CellMonitorFixture fixture;
     const PropertyList half = cell("UTRAN2", "Serving", {{"LAC", 7}, {"SCN", 8}});
     fixture.feed(cellsRecord({serving(100), serving(200), half}));
     EXPECT_EQ(fixture.text("Local Area Code"), "7");
@@ -48,7 +48,7 @@ TEST(UTRANServingCellInfoCellMonitor, TheScanDoesNotStopAtTheFirstMatchSoTheLast
 }
 
 TEST(UTRANServingCellInfoCellMonitor, OnlyServingCellsOfUTRAN2Count) {
-    Fixture fixture;
+    CellMonitorFixture fixture;
     fixture.feed(cellsRecord({
         cell("UMTS", "Serving", {{"LAC", 1}}),
         cell("GSM", "Serving", {{"LAC", 2}}),
@@ -83,7 +83,7 @@ TEST(UTRANServingCellInfoCellMonitor, AMissingNumberIsLoggedLeavesItsKeysAndStop
          "Serving Cell Info: Failed to retrieve UARFCN\n"},
     };
     for (const Row& row : rows) {
-        Fixture fixture;
+        CellMonitorFixture fixture;
         fixture.feed(cellsRecord({serving(100)}));
         const PropertyList cell = serving(200);
         cell.dictionary()->remove(row.constant);
@@ -98,7 +98,7 @@ TEST(UTRANServingCellInfoCellMonitor, AMissingNumberIsLoggedLeavesItsKeysAndStop
 }
 
 TEST(UTRANServingCellInfoCellMonitor, EveryNumberMissingIsFiveLinesInOrder) {
-    Fixture fixture;
+    CellMonitorFixture fixture;
     fixture.feed(cellsRecord({cell("UTRAN2", "Serving")}));
     EXPECT_EQ(fixture.lines,
               (Lines{{4, "Serving Cell Info"},
@@ -116,7 +116,7 @@ TEST(UTRANServingCellInfoCellMonitor, ANumberThatIsNoSigned32BitIntegerCountsAsM
     cell.dictionary()->set("kHXCellMonitorCellId", PropertyList::integer(-2147483648));
     cell.dictionary()->set("kHXCellMonitorSCN", "103");
     cell.dictionary()->set("kHXCellMonitorUARFCN", PropertyList::real(0.5));
-    Fixture fixture;
+    CellMonitorFixture fixture;
     fixture.feed(cellsRecord({cell}));
     EXPECT_EQ(fixture.lines,
               (Lines{{4, "Serving Cell Info"},
@@ -130,7 +130,7 @@ TEST(UTRANServingCellInfoCellMonitor, ANumberThatIsNoSigned32BitIntegerCountsAsM
 TEST(UTRANServingCellInfoCellMonitor, ABrokenPropertyListLogsOneLineAndChangesNothing) {
     // The text form, of which no beginning is a property list of its own.
     const ByteBuffer whole = textRecord(0xFF0001, "( { kHXCellMonitorLAC = 1; } )").bytes();
-    Fixture fixture;
+    CellMonitorFixture fixture;
     fixture.feed(cellsRecord({serving(100)}));
     for (std::size_t length = 0; length < whole.size(); ++length) {
         fixture.feed(ByteBuffer(whole.begin(), whole.begin() + static_cast<std::ptrdiff_t>(length)),
@@ -143,7 +143,7 @@ TEST(UTRANServingCellInfoCellMonitor, ABrokenPropertyListLogsOneLineAndChangesNo
 }
 
 TEST(UTRANServingCellInfoCellMonitor, AnEmptyArrayOrAnotherRootChangesNothingSilently) {
-    Fixture fixture;
+    CellMonitorFixture fixture;
     for (const PropertyList& root : {PropertyList(Array()), serving(100)}) {
         fixture.feed(propertyListRecord(0xFF0001, root));
         EXPECT_EQ(fixture.lines, (Lines{{4, "Serving Cell Info"}}));
@@ -165,7 +165,7 @@ TEST(UTRANServingCellInfoCellMonitor, WithoutASectionTheLinesAreTheSame) {
 }
 
 TEST(UTRANServingCellInfoCellMonitor, TheRecordAndTheCellMonitorShareTheirKeys) {
-    Fixture fixture;
+    CellMonitorFixture fixture;
     fixture.feed(cellsRecord({serving(100)}));
     fixture.feed(Record(0xD0E2).padTo(17).u16(9763).u16(10713).u32(5).u8(0));
     EXPECT_EQ(fixture.text("Uplink UARFCN"), "9763");

@@ -11,7 +11,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-Record state(unsigned rrState, unsigned mode = 1) {
+Record gsmState(unsigned rrState, unsigned mode = 1) {
     return Record(0x512C).u8(rrState).u8(200).u8(3).u8(mode);
 }
 
@@ -26,10 +26,10 @@ TEST(GSMRRInfo, SubscribesToItsFourRecords) {
 }
 
 TEST(GSMRRInfo, ShowsTheState) {
-    expectInOrder(sectionAfter<GSMRRInfo>(state(5)), Dictionary{{"RR State", "RR_IDLE"},
-                                                                {"RR Sub State", "200"},
-                                                                {"RR Status", "3"},
-                                                                {"RR Mode", "Data"}});
+    expectInOrder(sectionAfter<GSMRRInfo>(gsmState(5)), Dictionary{{"RR State", "RR_IDLE"},
+                                                                   {"RR Sub State", "200"},
+                                                                   {"RR Status", "3"},
+                                                                   {"RR Mode", "Data"}});
 }
 
 TEST(GSMRRInfo, EveryStateHasItsLabelAndByte22ShowsUnknown) {
@@ -60,7 +60,7 @@ TEST(GSMRRInfo, EveryStateHasItsLabelAndByte22ShowsUnknown) {
     ASSERT_EQ(labels.size(), 22U);
     RecordFixture<GSMRRInfo> fixture;
     for (unsigned value = 0; value < 256; ++value) {
-        fixture.feed(state(value));
+        fixture.feed(gsmState(value));
         EXPECT_EQ(fixture.text("RR State"), value < 22 ? labels[value] : "Unknown") << value;
     }
 }
@@ -68,7 +68,7 @@ TEST(GSMRRInfo, EveryStateHasItsLabelAndByte22ShowsUnknown) {
 TEST(GSMRRInfo, Byte16As0ShowsVoiceAndAnythingElseData) {
     RecordFixture<GSMRRInfo> fixture;
     for (const unsigned mode : {0U, 1U, 255U}) {
-        fixture.feed(state(0, mode));
+        fixture.feed(gsmState(0, mode));
         EXPECT_EQ(fixture.text("RR Mode"), mode == 0 ? "Voice" : "Data");
     }
 }
@@ -106,7 +106,7 @@ TEST(GSMRRInfo, ShowsTheSecondsOfDRX) {
 }
 
 TEST(GSMRRInfo, APacketOneByteTooShortChangesNothing) {
-    cutAtEveryLength<GSMRRInfo>(state(5), 17);
+    cutAtEveryLength<GSMRRInfo>(gsmState(5), 17);
     cutAtEveryLength<GSMRRInfo>(measurement(), 29);
     cutAtEveryLength<GSMRRInfo>(Record(0x5072).padTo(19).u8(1), 20);
     cutAtEveryLength<GSMRRInfo>(Record(0x51F6).padTo(16).u8(64).padTo(24), 24);
@@ -114,8 +114,8 @@ TEST(GSMRRInfo, APacketOneByteTooShortChangesNothing) {
 
 TEST(GSMRRInfo, LogsItsLineOnEveryCall) {
     RecordFixture<GSMRRInfo> fixture;
-    for (const Record& record : {state(5), Record(0x512C), measurement(), Record(0x5072).padTo(20),
-                                 Record(0x51F6).padTo(24)}) {
+    for (const Record& record : {gsmState(5), Record(0x512C), measurement(),
+                                 Record(0x5072).padTo(20), Record(0x51F6).padTo(24)}) {
         fixture.feed(record);
         EXPECT_EQ(fixture.lines, (Lines{{4, "GSMRRInfo"}}));
     }

@@ -17,7 +17,7 @@ Record identity() {
     return Record(0x5134).u16(1023).u16(63).u16(54321).padTo(26);
 }
 
-Record measurement() {
+Record servingMeasurement() {
     return Record(0x5137).padTo(15).u8(95).s32(-2).s32(70000).padTo(29);
 }
 
@@ -37,16 +37,16 @@ TEST(GSMServingCell, ShowsTheIdentity) {
 
 TEST(GSMServingCell, Byte15As95ShowsThePositiveLevel95dBm) {
     RecordFixture<GSMServingCell> fixture;
-    fixture.feed(measurement());
+    fixture.feed(servingMeasurement());
     EXPECT_EQ(fixture.text("RSSI"), "95 dBm");
     EXPECT_EQ(fixture.keys().find("RSSI")->displayNumber()->integer(), 95);
     EXPECT_EQ(fixture.keys().find("RSSI")->displayNumber()->unit(), "dBm");
-    fixture.feed(measurement().at(15, 255));
+    fixture.feed(servingMeasurement().at(15, 255));
     EXPECT_EQ(fixture.text("RSSI"), "255 dBm");
 }
 
 TEST(GSMServingCell, BytesFEFFFFFFShowC1As65534TheUnsignedLowHalf) {
-    expectInOrder(sectionAfter<GSMServingCell>(measurement()),
+    expectInOrder(sectionAfter<GSMServingCell>(servingMeasurement()),
                   Dictionary{{"RSSI", "95 dBm"}, {"C1 Value", "65534"}, {"C2 Value", "4464"}});
 }
 
@@ -57,7 +57,8 @@ TEST(GSMServingCell, TheDedicatedChannelIsTheLowByteOfItsField) {
 
 TEST(GSMServingCell, LogsItsLineOnEveryAcceptedPacket) {
     RecordFixture<GSMServingCell> fixture;
-    for (const Record& record : {identity(), measurement(), Record(0x5076).u16(1).padTo(17)}) {
+    for (const Record& record :
+         {identity(), servingMeasurement(), Record(0x5076).u16(1).padTo(17)}) {
         fixture.feed(record);
         EXPECT_EQ(fixture.lines, (Lines{{4, "GSMServingCell"}}));
     }
@@ -84,7 +85,7 @@ TEST(GSMServingCell, C1AndC2AreTheRxQualityOfGSMRRInfoReadWithAnotherWidthAndSig
 
 TEST(GSMServingCell, APacketOneByteTooShortChangesNothing) {
     cutAtEveryLength<GSMServingCell>(identity(), 26);
-    cutAtEveryLength<GSMServingCell>(measurement(), 29);
+    cutAtEveryLength<GSMServingCell>(servingMeasurement(), 29);
     cutAtEveryLength<GSMServingCell>(Record(0x5076).u16(1).padTo(17), 17);
     RecordFixture<GSMServingCell> fixture;
     fixture.feed(Record(0x5134).padTo(25));
@@ -139,7 +140,7 @@ TEST(GSMServingCell, AnArrayThatCannotBeReadIsLoggedTwiceAndChangesNothing) {
 TEST(GSMServingCell, AKeyKeepsItsLastValueUntilItIsOverwritten) {
     RecordFixture<GSMServingCell> fixture;
     fixture.feed(identity());
-    fixture.feed(measurement());
+    fixture.feed(servingMeasurement());
     fixture.feed(cellsRecord({cell("GSM", "Serving", {{"CellId", 7}, {"ARFCN", 8}})}));
     expectInOrder(fixture.section(), Dictionary{{"Cell ID", "7"},
                                                 {"ARFCN", "8"},

@@ -12,7 +12,7 @@ using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
 /// Two entries at the ends of their ranges.
-Record twoCells() {
+Record twoGsmCells() {
     return Record(0x4005)
         .u8(0) // UMTS entries
         .u8(2) // GSM entries
@@ -26,7 +26,7 @@ Record twoCells() {
         .s16(32767);
 }
 
-Array twoCellsShown() {
+Array twoGsmCellsShown() {
     return {Dictionary{
                 {"ARFCN", "975"}, {"BSIC", "63"}, {"RSSI", "-95 dBm"}, {"Ranking Value", "-32768"}},
             Dictionary{{"ARFCN", "65535"},
@@ -45,16 +45,16 @@ TEST(GSMSet, SubscribesToTheRankingRecord) {
 
 TEST(GSMSet, ShowsEveryEntryInPacketOrderWithItsKeysInOrder) {
     RecordFixture<GSMSet> fixture;
-    fixture.feed(twoCells());
+    fixture.feed(twoGsmCells());
     ASSERT_EQ(fixture.list().size(), 2U);
-    const Array expected = twoCellsShown();
+    const Array expected = twoGsmCellsShown();
     expectInOrder(fixture.list()[0], *expected[0].dictionary());
     expectInOrder(fixture.list()[1], *expected[1].dictionary());
 }
 
 TEST(GSMSet, ItsValuesKeepTheirNumbers) {
     RecordFixture<GSMSet> fixture;
-    fixture.feed(twoCells());
+    fixture.feed(twoGsmCells());
     ASSERT_EQ(fixture.list().size(), 2U);
     const DictionaryRef cell = fixture.list()[0].dictionary();
     EXPECT_EQ(cell->find("ARFCN")->displayNumber()->integer(), 975);
@@ -65,31 +65,31 @@ TEST(GSMSet, ItsValuesKeepTheirNumbers) {
 TEST(GSMSet, EveryPacketRebuildsTheListAndACountOf0EmptiesIt) {
     RecordFixture<GSMSet> fixture;
     fixture.list() = Array{"what was shown before"};
-    fixture.feed(twoCells());
-    EXPECT_EQ(fixture.list(), twoCellsShown());
-    fixture.feed(twoCells().at(14, 1));
-    EXPECT_EQ(fixture.list(), Array{twoCellsShown()[0]});
-    fixture.feed(twoCells().at(14, 0));
+    fixture.feed(twoGsmCells());
+    EXPECT_EQ(fixture.list(), twoGsmCellsShown());
+    fixture.feed(twoGsmCells().at(14, 1));
+    EXPECT_EQ(fixture.list(), Array{twoGsmCellsShown()[0]});
+    fixture.feed(twoGsmCells().at(14, 0));
     EXPECT_TRUE(fixture.list().empty());
 }
 
 TEST(GSMSet, TheUMTSCountSaysNothingToIt) {
     RecordFixture<GSMSet> fixture;
-    fixture.feed(twoCells().at(13, 255));
-    EXPECT_EQ(fixture.list(), twoCellsShown());
+    fixture.feed(twoGsmCells().at(13, 255));
+    EXPECT_EQ(fixture.list(), twoGsmCellsShown());
 }
 
 TEST(GSMSet, A14BytePacketLeavesTheListAsItWas) {
     RecordFixture<GSMSet> fixture;
-    fixture.feed(twoCells());
+    fixture.feed(twoGsmCells());
     fixture.feed(Record(0x4005).u8(1));
     EXPECT_EQ(fixture.lines, (Lines{{4, "GSMSet"}})) << "a short packet is dropped silently";
-    EXPECT_EQ(fixture.list(), twoCellsShown());
-    cutAtEveryLength<GSMSet>(twoCells(), 15);
+    EXPECT_EQ(fixture.list(), twoGsmCellsShown());
+    cutAtEveryLength<GSMSet>(twoGsmCells(), 15);
 }
 
 TEST(GSMSet, TheListStopsAtTheFirstEntryThatIsNotWhole) {
-    const ByteBuffer bytes = twoCells().at(14, 255).bytes();
+    const ByteBuffer bytes = twoGsmCells().at(14, 255).bytes();
     for (std::size_t length = 15; length <= bytes.size(); ++length) {
         RecordFixture<GSMSet> fixture;
         fixture.list() = Array{"what was shown before"};
@@ -101,11 +101,11 @@ TEST(GSMSet, TheListStopsAtTheFirstEntryThatIsNotWhole) {
 
 TEST(GSMSet, AnyOtherCodeIsUnknownAndChangesNothing) {
     RecordFixture<GSMSet> fixture;
-    fixture.feed(twoCells());
+    fixture.feed(twoGsmCells());
     EXPECT_EQ(fixture.lines, (Lines{{4, "GSMSet"}}));
     fixture.feed(Record(0x417A).padTo(100));
     EXPECT_EQ(fixture.lines, (Lines{{4, "GSMSet"}, {3, "Received an unknown log message: 16762"}}));
-    EXPECT_EQ(fixture.list(), twoCellsShown());
+    EXPECT_EQ(fixture.list(), twoGsmCellsShown());
 }
 
 TEST(GSMSet, AnyBytesKeepItsEntriesWithinItsKeys) {

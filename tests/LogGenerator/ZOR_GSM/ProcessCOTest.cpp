@@ -11,7 +11,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-Record state(unsigned mmState) {
+Record coState(unsigned mmState) {
     return Record(0x7131).u8(mmState).u8(8).u8(3);
 }
 
@@ -24,7 +24,7 @@ TEST(ProcessCO, SubscribesToMMStateAndRegistration) {
 }
 
 TEST(ProcessCO, ShowsTheMMStateOnly) {
-    expectInOrder(sectionAfter<ProcessCO>(state(20)),
+    expectInOrder(sectionAfter<ProcessCO>(coState(20)),
                   Dictionary{{"MM State", "MM_WAIT_FOR_ADDITIONAL_OUTGOING_MM_ CONNECTION"}});
 }
 
@@ -67,7 +67,7 @@ TEST(ProcessCO, EveryMMStateHasItsLabel) {
     };
     RecordFixture<ProcessCO> fixture;
     for (unsigned value = 0; value < 256; ++value) {
-        fixture.feed(state(value));
+        fixture.feed(coState(value));
         EXPECT_EQ(fixture.text("MM State"), value < labels.size() ? labels[value] : "Unknown")
             << value;
     }
@@ -75,7 +75,7 @@ TEST(ProcessCO, EveryMMStateHasItsLabel) {
 
 TEST(ProcessCO, LogsTheLineOfProcessCS) {
     RecordFixture<ProcessCO> fixture;
-    fixture.feed(state(19));
+    fixture.feed(coState(19));
     EXPECT_EQ(fixture.lines, (Lines{{4, "ProcessCS"}}));
 }
 
@@ -88,7 +88,7 @@ TEST(ProcessCO, AnyOtherCodeIsUnknownAndChangesNothing) {
 }
 
 TEST(ProcessCO, A15BytePacketOfAnySubscribedCodeChangesNothing) {
-    cutAtEveryLength<ProcessCO>(state(19), 16);
+    cutAtEveryLength<ProcessCO>(coState(19), 16);
     cutAtEveryLength<ProcessCO>(Record(0x7132).u8(1).padTo(16), 16);
 }
 

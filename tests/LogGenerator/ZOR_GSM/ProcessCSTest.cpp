@@ -11,7 +11,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-Record state(unsigned mmState, unsigned subState, unsigned status) {
+Record csState(unsigned mmState, unsigned subState, unsigned status) {
     return Record(0x7131).u8(mmState).u8(subState).u8(status);
 }
 
@@ -24,7 +24,7 @@ TEST(ProcessCS, SubscribesToMMStateAndRegistration) {
 }
 
 TEST(ProcessCS, Bytes20And8And3GiveTheAdditionalConnectionNormalServiceAndAreaNotAllowed) {
-    expectInOrder(sectionAfter<ProcessCS>(state(20, 8, 3)),
+    expectInOrder(sectionAfter<ProcessCS>(csState(20, 8, 3)),
                   Dictionary{{"MM State", "MM_WAIT_FOR_ADDITIONAL_OUTGOING_MM_ CONNECTION"},
                              {"MM Sub State", "MM_NORMAL_SERVICE"},
                              {"LU Reject Cause", "LOCATION_AREA_NOT_ALLOWED"}});
@@ -33,7 +33,7 @@ TEST(ProcessCS, Bytes20And8And3GiveTheAdditionalConnectionNormalServiceAndAreaNo
 TEST(ProcessCS, AnInTableGapAndAValueOutOfRangeShowUnknown) {
     RecordFixture<ProcessCS> fixture;
     for (const unsigned value : {1U, 26U, 255U}) {
-        fixture.feed(state(value, 9, 4));
+        fixture.feed(csState(value, 9, 4));
         expectInOrder(fixture.section(), Dictionary{{"MM State", "Unknown"},
                                                     {"MM Sub State", "Unknown"},
                                                     {"LU Reject Cause", "Unknown"}});
@@ -52,7 +52,7 @@ TEST(ProcessCS, EverySubStateAndRejectCauseHasItsLabel) {
                                              "LOCATION_AREA_NOT_ALLOWED"};
     RecordFixture<ProcessCS> fixture;
     for (unsigned value = 0; value < 256; ++value) {
-        fixture.feed(state(0, value, value));
+        fixture.feed(csState(0, value, value));
         EXPECT_EQ(fixture.text("MM Sub State"),
                   value < subStates.size() ? subStates[value] : "Unknown");
         EXPECT_EQ(fixture.text("LU Reject Cause"),
@@ -76,7 +76,7 @@ TEST(ProcessCS, ShowsEveryRegistrationState) {
 
 TEST(ProcessCS, AKeyKeepsItsLastValueUntilItIsOverwritten) {
     RecordFixture<ProcessCS> fixture;
-    fixture.feed(state(19, 8, 0));
+    fixture.feed(csState(19, 8, 0));
     fixture.feed(Record(0x7132).u8(1).padTo(16));
     expectInOrder(fixture.section(), Dictionary{{"MM State", "MM_IDLE"},
                                                 {"MM Sub State", "MM_NORMAL_SERVICE"},
@@ -86,7 +86,7 @@ TEST(ProcessCS, AKeyKeepsItsLastValueUntilItIsOverwritten) {
 
 TEST(ProcessCS, LogsItsLineOnEveryCall) {
     RecordFixture<ProcessCS> fixture;
-    fixture.feed(state(19, 8, 0));
+    fixture.feed(csState(19, 8, 0));
     EXPECT_EQ(fixture.lines, (Lines{{4, "ProcessCS"}}));
     fixture.feed(Record(0x7131).bytes());
     EXPECT_EQ(fixture.lines, (Lines{{4, "ProcessCS"}})) << "a short packet is dropped silently";
@@ -101,7 +101,7 @@ TEST(ProcessCS, AnyOtherCodeIsUnknownAndChangesNothing) {
 }
 
 TEST(ProcessCS, A15BytePacketOfAnySubscribedCodeChangesNothing) {
-    cutAtEveryLength<ProcessCS>(state(19, 8, 0), 16);
+    cutAtEveryLength<ProcessCS>(csState(19, 8, 0), 16);
     cutAtEveryLength<ProcessCS>(Record(0x7132).u8(1).padTo(16), 16);
 }
 

@@ -11,7 +11,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-Record state(unsigned gmmState, unsigned subState, unsigned status) {
+Record psState(unsigned gmmState, unsigned subState, unsigned status) {
     return Record(0x7130).u8(gmmState).u8(subState).u8(status);
 }
 
@@ -24,7 +24,7 @@ TEST(ProcessPS, SubscribesToGMMStateAndRegistration) {
 }
 
 TEST(ProcessPS, ShowsItsGMMStateUnderMMState) {
-    expectInOrder(sectionAfter<ProcessPS>(state(3, 9, 2)),
+    expectInOrder(sectionAfter<ProcessPS>(psState(3, 9, 2)),
                   Dictionary{{"MM State", "GMM_REGISTERED"},
                              {"MM Sub State", "GMM_ATTEMPING_TO_UPDATE"},
                              {"Attach Reject Cause", "GMM_GU3_PLMN_NOT_ALLOWED"}});
@@ -32,7 +32,7 @@ TEST(ProcessPS, ShowsItsGMMStateUnderMMState) {
 
 TEST(ProcessPS, ASubStateOf13ShowsUnknown) {
     RecordFixture<ProcessPS> fixture;
-    fixture.feed(state(7, 13, 4));
+    fixture.feed(psState(7, 13, 4));
     expectInOrder(fixture.section(), Dictionary{{"MM State", "Unknown"},
                                                 {"MM Sub State", "Unknown"},
                                                 {"Attach Reject Cause", "Unknown"}});
@@ -71,7 +71,7 @@ TEST(ProcessPS, EveryStateSubStateAndRejectCauseHasItsLabel) {
     };
     RecordFixture<ProcessPS> fixture;
     for (unsigned value = 0; value < 256; ++value) {
-        fixture.feed(state(value, value, value));
+        fixture.feed(psState(value, value, value));
         EXPECT_EQ(fixture.text("MM State"), value < states.size() ? states[value] : "Unknown");
         EXPECT_EQ(fixture.text("MM Sub State"),
                   value < subStates.size() ? subStates[value] : "Unknown");
@@ -89,7 +89,7 @@ TEST(ProcessPS, ShowsTheRegistrationState) {
 
 TEST(ProcessPS, LogsItsLineAndUnknownCodes) {
     RecordFixture<ProcessPS> fixture;
-    fixture.feed(state(3, 0, 0));
+    fixture.feed(psState(3, 0, 0));
     EXPECT_EQ(fixture.lines, (Lines{{4, "ProcessPS"}}));
     const PropertyList before = fixture.snapshot();
     fixture.feed(Record(0x7131).padTo(16));
@@ -99,7 +99,7 @@ TEST(ProcessPS, LogsItsLineAndUnknownCodes) {
 }
 
 TEST(ProcessPS, A15BytePacketOfAnySubscribedCodeChangesNothing) {
-    cutAtEveryLength<ProcessPS>(state(3, 0, 0), 16);
+    cutAtEveryLength<ProcessPS>(psState(3, 0, 0), 16);
     cutAtEveryLength<ProcessPS>(Record(0x7132).u8(1).padTo(16), 16);
 }
 

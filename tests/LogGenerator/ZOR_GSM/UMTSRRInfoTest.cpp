@@ -13,7 +13,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-Record state(unsigned value) {
+Record umtsState(unsigned value) {
     return Record(0x4125).u8(value);
 }
 
@@ -53,8 +53,8 @@ TEST(UMTSRRInfo, SubscribesToStatePowerIdentityCipheringAndTheCellMonitor) {
 }
 
 TEST(UMTSRRInfo, RRCStateByte3ShowsCELL_DCHAnd6ShowsUnknown) {
-    expectInOrder(sectionAfter<UMTSRRInfo>(state(3)), Dictionary{{"RRC State", "CELL_DCH"}});
-    expectInOrder(sectionAfter<UMTSRRInfo>(state(6)), Dictionary{{"RRC State", "Unknown"}});
+    expectInOrder(sectionAfter<UMTSRRInfo>(umtsState(3)), Dictionary{{"RRC State", "CELL_DCH"}});
+    expectInOrder(sectionAfter<UMTSRRInfo>(umtsState(6)), Dictionary{{"RRC State", "Unknown"}});
 }
 
 TEST(UMTSRRInfo, EveryRRCStateHasItsLabel) {
@@ -62,7 +62,7 @@ TEST(UMTSRRInfo, EveryRRCStateHasItsLabel) {
                                              "CELL_DCH",     "CELL_PCH",   "URA_PCH"};
     RecordFixture<UMTSRRInfo> fixture;
     for (unsigned value = 0; value < 256; ++value) {
-        fixture.feed(state(value));
+        fixture.feed(umtsState(value));
         EXPECT_EQ(fixture.text("RRC State"), value < labels.size() ? labels[value] : "Unknown");
     }
 }
@@ -151,7 +151,8 @@ TEST(UMTSRRInfo, ATransmitPowerEntryIsWholeWhenItsRawPowerIs) {
 
 TEST(UMTSRRInfo, LogsItsLineOnEveryCall) {
     RecordFixture<UMTSRRInfo> fixture;
-    for (const Record& record : {state(0), identity(0, 0, 0, 0), ciphering(0), transmitPower({})}) {
+    for (const Record& record :
+         {umtsState(0), identity(0, 0, 0, 0), ciphering(0), transmitPower({})}) {
         fixture.feed(record);
         EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSRRInfo"}}));
     }
@@ -171,7 +172,7 @@ TEST(UMTSRRInfo, AnyOtherCodeIsUnknownAndChangesNothing) {
 }
 
 TEST(UMTSRRInfo, APacketOneByteBelowItsMinimumChangesNothing) {
-    cutAtEveryLength<UMTSRRInfo>(state(3), 14);
+    cutAtEveryLength<UMTSRRInfo>(umtsState(3), 14);
     cutAtEveryLength<UMTSRRInfo>(identity(1, 2, 3, 4), 29);
     cutAtEveryLength<UMTSRRInfo>(ciphering(1), 19);
     cutAtEveryLength<UMTSRRInfo>(transmitPower({88, -12}), 16);
@@ -179,11 +180,11 @@ TEST(UMTSRRInfo, APacketOneByteBelowItsMinimumChangesNothing) {
 
 TEST(UMTSRRInfo, EachCodesKeysStayUntilTheyAreOverwritten) {
     RecordFixture<UMTSRRInfo> fixture;
-    fixture.feed(state(3));
+    fixture.feed(umtsState(3));
     fixture.feed(ciphering(1));
     fixture.feed(transmitPower({88}));
     fixture.feed(identity(1, 2, 3, 4));
-    fixture.feed(state(0));
+    fixture.feed(umtsState(0));
     expectInOrder(fixture.section(), Dictionary{{"RRC State", "Disconnected"},
                                                 {"Ciphering", "Enabled"},
                                                 {"Transmit Power", "-10.00 dBm"},

@@ -13,7 +13,7 @@ using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
 /// The second entry holds the ends of the ranges.
-Record twoCells() {
+Record twoUmtsCells() {
     return Record(0x4005)
         .u8(2) // UMTS entries
         .u8(0) // GSM entries
@@ -31,7 +31,7 @@ Record twoCells() {
         .s16(-32768);
 }
 
-Array twoCellsShown() {
+Array twoUmtsCellsShown() {
     return {Dictionary{{"Scrambling Code", "388"},
                        {"RSCP", "-53 dB"},
                        {"Energy Per Chip", "-7.500000 dB"},
@@ -57,23 +57,23 @@ TEST(UMTSSet, SubscribesToTheRankingRecordAndTheCellMonitor) {
 
 TEST(UMTSSet, EntryByte0xE0ShowsRSCPAsMinus53dBAndByte0xF1TheEnergyAsMinus7Point5dB) {
     RecordFixture<UMTSSet> fixture;
-    fixture.feed(twoCells().at(13, 1));
+    fixture.feed(twoUmtsCells().at(13, 1));
     ASSERT_EQ(fixture.list().size(), 1U);
-    expectInOrder(fixture.list()[0], *twoCellsShown()[0].dictionary());
+    expectInOrder(fixture.list()[0], *twoUmtsCellsShown()[0].dictionary());
 }
 
 TEST(UMTSSet, ShowsEveryEntryInPacketOrderWithItsKeysInOrder) {
     RecordFixture<UMTSSet> fixture;
-    fixture.feed(twoCells());
+    fixture.feed(twoUmtsCells());
     ASSERT_EQ(fixture.list().size(), 2U);
-    const Array expected = twoCellsShown();
+    const Array expected = twoUmtsCellsShown();
     expectInOrder(fixture.list()[0], *expected[0].dictionary());
     expectInOrder(fixture.list()[1], *expected[1].dictionary());
 }
 
 TEST(UMTSSet, ItsValuesKeepTheirNumbers) {
     RecordFixture<UMTSSet> fixture;
-    fixture.feed(twoCells());
+    fixture.feed(twoUmtsCells());
     ASSERT_EQ(fixture.list().size(), 2U);
     const DictionaryRef cell = fixture.list()[0].dictionary();
     EXPECT_EQ(cell->find("RSCP")->displayNumber()->integer(), -53);
@@ -122,23 +122,23 @@ TEST(UMTSSet, TheUMTSAndTheGSMListOf0x4005AreReadFromTheSameBytes) {
 TEST(UMTSSet, EveryPacketRebuildsTheListAndACountOf0EmptiesIt) {
     RecordFixture<UMTSSet> fixture;
     fixture.list() = Array{"what was shown before"};
-    fixture.feed(twoCells());
-    EXPECT_EQ(fixture.list(), twoCellsShown());
-    fixture.feed(twoCells().at(13, 0));
+    fixture.feed(twoUmtsCells());
+    EXPECT_EQ(fixture.list(), twoUmtsCellsShown());
+    fixture.feed(twoUmtsCells().at(13, 0));
     EXPECT_TRUE(fixture.list().empty());
 }
 
 TEST(UMTSSet, A14BytePacketLeavesTheListAsItWas) {
     RecordFixture<UMTSSet> fixture;
-    fixture.feed(twoCells());
+    fixture.feed(twoUmtsCells());
     fixture.feed(Record(0x4005).u8(1));
     EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSSet"}})) << "a short packet is dropped silently";
-    EXPECT_EQ(fixture.list(), twoCellsShown());
-    cutAtEveryLength<UMTSSet>(twoCells(), 15);
+    EXPECT_EQ(fixture.list(), twoUmtsCellsShown());
+    cutAtEveryLength<UMTSSet>(twoUmtsCells(), 15);
 }
 
 TEST(UMTSSet, TheListStopsAtTheFirstEntryThatIsNotWhole) {
-    const ByteBuffer bytes = twoCells().at(13, 255).bytes();
+    const ByteBuffer bytes = twoUmtsCells().at(13, 255).bytes();
     for (std::size_t length = 15; length <= bytes.size(); ++length) {
         RecordFixture<UMTSSet> fixture;
         fixture.list() = Array{"what was shown before"};
@@ -150,12 +150,12 @@ TEST(UMTSSet, TheListStopsAtTheFirstEntryThatIsNotWhole) {
 
 TEST(UMTSSet, AnyOtherCodeIsUnknownAndChangesNothing) {
     RecordFixture<UMTSSet> fixture;
-    fixture.feed(twoCells());
+    fixture.feed(twoUmtsCells());
     EXPECT_EQ(fixture.lines, (Lines{{4, "UMTSSet"}}));
     fixture.feed(Record(0x417A).padTo(100));
     EXPECT_EQ(fixture.lines,
               (Lines{{4, "UMTSSet"}, {3, "Received an unknown log message: 16762"}}));
-    EXPECT_EQ(fixture.list(), twoCellsShown());
+    EXPECT_EQ(fixture.list(), twoUmtsCellsShown());
 }
 
 TEST(UMTSSet, AnyBytesKeepItsEntriesWithinItsKeys) {

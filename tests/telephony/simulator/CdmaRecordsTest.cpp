@@ -16,10 +16,6 @@ std::string keyOf(std::size_t index, unsigned pn) {
     return std::to_string(index) + ";" + text(pn);
 }
 
-double numberOf(const std::string& shown) {
-    return std::strtod(shown.c_str(), nullptr);
-}
-
 TEST(CdmaRecords, TheEvdoStatusIsShownAsEncoded) {
     EXPECT_TRUE(doubles::holds([] {
         const auto band = oneOf<unsigned>({{0, "800 MHz cellular band [0]"},

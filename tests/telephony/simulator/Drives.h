@@ -4,7 +4,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdlib>
 #include <functional>
 #include <map>
 #include <string>
@@ -50,10 +49,6 @@ inline void inEveryDrive(const DriveOptions& options,
 
 inline bool contains(const std::vector<std::string>& list, const std::string& text) {
     return std::find(list.begin(), list.end(), text) != list.end();
-}
-
-inline double numberOf(const std::string& shown) {
-    return std::strtod(shown.c_str(), nullptr);
 }
 
 /// A shown quantity, one curve for each cell or channel that it is told of.

@@ -9,7 +9,7 @@ namespace pallax {
 namespace {
 
 template <class Value>
-DecodedDisplay shown(const Value& value) {
+DecodedDisplay shownByGsm(const Value& value) {
     DecodedDisplay decoded("gsm");
     feedEncoded(decoded, value);
     return decoded;
@@ -18,7 +18,7 @@ DecodedDisplay shown(const Value& value) {
 TEST(GsmRecords, AServingCellIsShownAsEncoded) {
     EXPECT_TRUE(doubles::holds([] {
         const gsm::ServingIdentity cell{below(65536), below(65536), below(65536)};
-        RC_ASSERT(shown(cell).section("GSM Serving Cell") ==
+        RC_ASSERT(shownByGsm(cell).section("GSM Serving Cell") ==
                   PropertyList(Dictionary{{"Cell ID", text(cell.cellId)},
                                           {"ARFCN", text(cell.arfcn)},
                                           {"BSIC", text(cell.bsic)}}));
@@ -232,7 +232,7 @@ TEST(GsmRecords, TheSearchersActiveCellsAreShownAsEncoded) {
                                {"Energy Per Chip", std::to_string(cell.ecno_db) + " dB"}});
             }
         }
-        RC_ASSERT(shown(gsm::Searcher{carrier_dbm, cells}).section("Active Set") ==
+        RC_ASSERT(shownByGsm(gsm::Searcher{carrier_dbm, cells}).section("Active Set") ==
                   PropertyList(expected));
     }));
 }

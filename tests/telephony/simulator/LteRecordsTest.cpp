@@ -18,7 +18,7 @@ std::string db(double quality) {
 }
 
 template <class Value>
-DecodedDisplay shown(const Value& value) {
+DecodedDisplay shownByLte(const Value& value) {
     DecodedDisplay decoded("lte");
     feedEncoded(decoded, value);
     return decoded;
@@ -28,7 +28,7 @@ TEST(LteRecords, AServingCellIsShownAsEncoded) {
     EXPECT_TRUE(doubles::holds([] {
         const lte::ServingCellInfo info{below(504), below(65536),     below(65536), 50,
                                         25,         below(1U << 28U), below(65536), below(256)};
-        const DecodedDisplay decoded = shown(info);
+        const DecodedDisplay decoded = shownByLte(info);
         const auto text = [&](const char* key) { return decoded.text("Serving Cell Info", key); };
         RC_ASSERT(text("Physical Cell ID") == std::to_string(info.physicalCellId));
         RC_ASSERT(text("Download Frequency") == std::to_string(info.downlinkEarfcn));
@@ -44,8 +44,9 @@ TEST(LteRecords, AServingCellIsShownAsEncoded) {
 TEST(LteRecords, AntennasAreShownAsEncoded) {
     EXPECT_TRUE(doubles::holds([] {
         const unsigned count = below(256);
-        RC_ASSERT(shown(lte::AntennaReport{count}).text("Serving Cell Info", "Num Tx Antennas") ==
-                  std::to_string(count));
+        RC_ASSERT(
+            shownByLte(lte::AntennaReport{count}).text("Serving Cell Info", "Num Tx Antennas") ==
+            std::to_string(count));
     }));
 }
 
@@ -69,7 +70,7 @@ TEST(LteRecords, AnIdleServingCellIsShownAsEncoded) {
         cell.nonIntraSearch_db = -1;
         cell.rulesUpdated = below(2) == 1;
         cell.rules = below(16);
-        const DecodedDisplay decoded = shown(cell);
+        const DecodedDisplay decoded = shownByLte(cell);
         const Dictionary expected = {
             {"Version", "3"},
             {"E-ARFCN", std::to_string(cell.earfcn)},
@@ -125,7 +126,7 @@ TEST(LteRecords, IdleNeighboursAreShownAsEncoded) {
                            {"Ant 1 Frame Offset", frame},
                            {"Ant 1 Sample Offset", sample}});
         }
-        const DecodedDisplay decoded = shown(lte::IdleNeighbours{1850, -122, cells});
+        const DecodedDisplay decoded = shownByLte(lte::IdleNeighbours{1850, -122, cells});
         RC_ASSERT(decoded.section("Neighbor Cells List") == PropertyList(expected));
         RC_ASSERT(decoded.text("Neighbor Measurements", "E-ARFCN") == "1850");
         RC_ASSERT(decoded.text("Neighbor Measurements", "Qrxlevmin") == "-122 dBm");
@@ -155,7 +156,7 @@ TEST(LteRecords, AConnectedMeasurementIsShownAsEncoded) {
             expectedDetected.emplace_back(Dictionary{{"Physical Cell ID", std::to_string(each)}});
         }
         const DecodedDisplay decoded =
-            shown(lte::ConnectedMeasurement{3300, 9999, serving, measured, detected});
+            shownByLte(lte::ConnectedMeasurement{3300, 9999, serving, measured, detected});
         RC_ASSERT(decoded.section("Measured Neighbor Cells") == PropertyList(expected));
         RC_ASSERT(decoded.section("Detected Cells") == PropertyList(expectedDetected));
         const Dictionary expectedServing = {
@@ -203,7 +204,7 @@ TEST(LteRecords, ACandidateOfEachTechnologyIsShownAsEncoded) {
             break;
         }
         const DecodedDisplay decoded =
-            shown(lte::ReselectionCandidates{1850, 77, std::span(&candidate, 1)});
+            shownByLte(lte::ReselectionCandidates{1850, 77, std::span(&candidate, 1)});
         RC_ASSERT(decoded.section("Reselection Candidates List") == PropertyList(Array{expected}));
         RC_ASSERT(decoded.text("Reselection Candidates", "Serving Cell ID") == "77");
         RC_ASSERT(decoded.text("Reselection Candidates", "Serving EARFCN") == "1850");

@@ -12,6 +12,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -26,6 +27,11 @@ inline SimulationOptions simulationOf(std::string_view commandName, std::uint64_
     options.seed = seed;
     options.duration = duration;
     return options;
+}
+
+/// The number with which a shown value begins; 0 where none does.
+inline double numberOf(const std::string& shown) {
+    return std::strtod(shown.c_str(), nullptr);
 }
 
 /// A technology's real generator, whose display is read back.

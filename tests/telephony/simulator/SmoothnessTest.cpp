@@ -9,7 +9,7 @@ namespace {
 using std::chrono::seconds;
 
 /// A second; the reports of a kind come less than two of the scenario's steps apart.
-constexpr unsigned kRate = 10;
+constexpr unsigned kPacketsPerSecond = 10;
 
 /// A level moves so much within two steps of the scenario, with the noise of two measurements and
 /// the rounding to whole decibels.
@@ -24,7 +24,7 @@ TEST(Smoothness, GsmLevelsAreInRangeMoveSmoothlyAndNeighboursAreTheStrongest) {
     Curve cost("C1", 0, 70, kLevelStepDb);
     std::map<std::string, std::string> bsics;
     std::uint64_t seed = 0;
-    inEveryDrive({"gsm", seconds(60), kRate}, [&](const DriveMoment& moment) {
+    inEveryDrive({"gsm", seconds(60), kPacketsPerSecond}, [&](const DriveMoment& moment) {
         if (moment.seed != seed) {
             bsics.clear();
             seed = moment.seed;
@@ -57,7 +57,7 @@ TEST(Smoothness, UmtsLevelsAndPowersAreInRangeAndMoveSmoothly) {
     Curve level("RSCP", -125, -30, kHillStepDb);
     Curve quality("Ec/No", -22, -1, kLevelStepDb);
     Curve power("transmit power", -50, 23, kHillStepDb);
-    inEveryDrive({"gsm", seconds(60), kRate}, [&](const DriveMoment& moment) {
+    inEveryDrive({"gsm", seconds(60), kPacketsPerSecond}, [&](const DriveMoment& moment) {
         const DecodedDisplay& decoded = moment.decoded;
         if (moment.code == 0x417A) {
             const auto codes = decoded.texts("Active Set", "Scrambling Code");
@@ -77,7 +77,7 @@ TEST(Smoothness, UmtsLevelsAndPowersAreInRangeAndMoveSmoothly) {
 }
 
 TEST(Smoothness, NoMoreUmtsBlocksAreLostThanSent) {
-    inEveryDrive({"gsm", seconds(40), kRate}, [&](const DriveMoment& moment) {
+    inEveryDrive({"gsm", seconds(40), kPacketsPerSecond}, [&](const DriveMoment& moment) {
         const DecodedDisplay& decoded = moment.decoded;
         const auto expectNoMore = [](const PropertyList* list, const char* part,
                                      const char* whole) {
@@ -107,7 +107,7 @@ TEST(Smoothness, UtranLevelsAndQualitiesAreInRangeAndMoveSmoothly) {
     Curve level("RSCP", 0.01, 1, kLevelStepDb / kStepOfTheRecord);
     Curve errors("block errors", 0, 60, 18);
     Curve ratio("signal to interference", 0, 63, 15);
-    inEveryDrive({"utran", seconds(30), kRate}, [&](const DriveMoment& moment) {
+    inEveryDrive({"utran", seconds(30), kPacketsPerSecond}, [&](const DriveMoment& moment) {
         const DecodedDisplay& decoded = moment.decoded;
         const std::string serving = decoded.text("Serving Cell Info", "Cell ID");
         if (moment.code == 0xD00A) {
@@ -155,7 +155,7 @@ TEST(Smoothness, CdmaLevelsAndPilotsAreInRangeAndMoveSmoothly) {
     Curve evdoReceive("EV-DO receive level", -106, -25, kLevelStepDb);
     Curve evdoTransmit("EV-DO transmit level", -50, 23, kLevelStepDb);
     Curve evdoPilots("EV-DO Ec/Io", -15.1, -0.4, kLevelStepDb);
-    inEveryDrive({"cdma", seconds(30), 2 * kRate}, [&](const DriveMoment& moment) {
+    inEveryDrive({"cdma", seconds(30), 2 * kPacketsPerSecond}, [&](const DriveMoment& moment) {
         const DecodedDisplay& decoded = moment.decoded;
         const auto seeShown = [&](Curve& curve, const std::string& shown) {
             if (shown != "N/A" && shown != "(absent)") {
@@ -184,7 +184,7 @@ TEST(Smoothness, CdmaLevelsAndPilotsAreInRangeAndMoveSmoothly) {
 TEST(Smoothness, CdmaDataRatesAreThoseOfALink) {
     Curve forward("forward rate", 0, 2458, 2458); // kbit/s, the most that there is
     Curve reverse("reverse rate", 0, 1800, 1800);
-    inEveryDrive({"cdma", seconds(60), kRate}, [&](const DriveMoment& moment) {
+    inEveryDrive({"cdma", seconds(60), kPacketsPerSecond}, [&](const DriveMoment& moment) {
         if (moment.code == 0x1192) {
             forward.see(moment, "", moment.decoded.text("Data Rates", "Forward Link"));
         } else if (moment.code == 0x127E) {
@@ -205,7 +205,7 @@ TEST(Smoothness, IfxLevelsAreInRangeMoveSmoothlyAndNeighboursAreTheStrongest) {
     Curve advance("timing advance", 0, 4, 1);
     std::map<std::string, std::string> bsics;
     std::uint64_t seed = 0;
-    inEveryDrive({"ifx", seconds(20), kRate / 2}, [&](const DriveMoment& moment) {
+    inEveryDrive({"ifx", seconds(20), kPacketsPerSecond / 2}, [&](const DriveMoment& moment) {
         if (moment.seed != seed) {
             bsics.clear();
             seed = moment.seed;
