@@ -42,7 +42,7 @@ class RecordingDecoder {
 public:
     /// Packet bytes after which the display is generated although no tick has passed, for a
     /// generator keeps what it has received since the previous time.
-    static constexpr std::size_t kMostUnseenBytes = std::size_t{4} << 20U;
+    static constexpr std::size_t kMostUnseenBytes = std::size_t{1} << 20U;
 
     RecordingDecoder(const DecoderEnvironment& environment, std::string_view technology,
                      Every every, DisplayOutput& output);

@@ -116,13 +116,13 @@ TEST_F(DecodeCommandTest, EveryModeGeneratesTheDisplayAtTheTicksOfTheRecording) 
 
 TEST_F(DecodeCommandTest, AStretchWithoutTicksDoesNotGrowWithoutBound) {
     options.every = Every::Tick;
-    const std::string packet = "A=" + std::string((std::size_t{1} << 20U) - 2, 'x');
+    constexpr std::size_t kQuarterMebibyte = std::size_t{1} << 18U;
+    const std::string packet = "A=" + std::string(kQuarterMebibyte - 2, 'x');
     add("a.pcap", Packets(10, {milliseconds(0), packet}));
     EXPECT_EQ(run(), kExitSuccess);
-    const std::size_t mebibyte = std::size_t{1} << 20U;
     EXPECT_EQ(ScriptedGenerator::generations,
-              (std::vector<ScriptedGenerator::Generated>{{kFirstPacket, 5 * mebibyte},
-                                                         {kFirstPacket, 5 * mebibyte},
+              (std::vector<ScriptedGenerator::Generated>{{kFirstPacket, 5 * kQuarterMebibyte},
+                                                         {kFirstPacket, 5 * kQuarterMebibyte},
                                                          {kFirstPacket + seconds(2), 0}}));
     EXPECT_EQ(std::count(written.begin(), written.end(), '\n'), 1);
 }

@@ -45,7 +45,7 @@ protected:
         return path;
     }
 
-    /// The sample recording of a GSM attach, 48 packets over half a minute.
+    /// The sample recording of a GSM attach, 51 packets over half a minute.
     std::string gsmAttach() const {
         const std::string path = world.path("gsm-attach.pcap");
         EXPECT_EQ(writeSample(samples().front(), path), std::nullopt);

@@ -4,6 +4,7 @@
 #include <csignal>
 #include <filesystem>
 #include <fstream>
+#include <map>
 #include <sstream>
 
 namespace pallax {
@@ -74,6 +75,35 @@ TEST_F(EndToEndBrowse, TheTicksAreThoseOfDecode) {
     EXPECT_EQ(played.out, run({recording, "--speed", "max"}).out) << "played twice, printed alike";
     EXPECT_EQ(played.out, run({"-", "--speed", "max"}, recording).out);
     EXPECT_TRUE(nothingLeft());
+}
+
+TEST_F(EndToEndBrowse, TheSampleShowsThePhoneComeUpUpdateItsLocationAndDetach) {
+    const Run played = run({gsmAttach(), "--print", "--speed", "max"});
+    EXPECT_EQ(played.status, 0) << played.err;
+    // What each printed tree shows of the two sections, one line for each run of equal ones.
+    std::map<std::string, std::vector<std::string>> shown;
+    std::string section;
+    std::istringstream stream(played.out);
+    for (std::string line; std::getline(stream, line);) {
+        if (!line.starts_with(' ') && !line.starts_with('*')) {
+            section = line;
+        }
+        constexpr std::string_view kStateLine = "  MM State: ";
+        constexpr std::string_view kChangedLine = "* MM State: ";
+        if (line.starts_with(kStateLine) || line.starts_with(kChangedLine)) {
+            auto& states = shown[section];
+            const std::string state = line.substr(kStateLine.size());
+            const bool isNew = states.empty() || states.back() != state;
+            EXPECT_EQ(isNew && !states.empty(), line.starts_with('*')) << line;
+            if (isNew) {
+                states.push_back(state);
+            }
+        }
+    }
+    const std::vector<std::string> states{"MM_IDLE", "MM_LOCATION_UPDATE_INITIATED", "MM_IDLE",
+                                          "MM_IMSI_DETACH_INITIATED", "MM_NULL"};
+    EXPECT_EQ(shown["Process CO"], states);
+    EXPECT_EQ(shown["Process CS"], states);
 }
 
 TEST_F(EndToEndBrowse, ARecordingThatCannotBeOpenedIsAFailure) {

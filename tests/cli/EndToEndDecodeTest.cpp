@@ -78,6 +78,29 @@ TEST_F(EndToEnd, DecodeAtEachTickAndPacket) {
     EXPECT_EQ(packets[1]["display"]["Process CO"]["MM Service State"], "REG_STATE_REGISTERING");
 }
 
+TEST_F(EndToEnd, DecodeOfTheSampleIsJsonAtItsEndEachTickAndEachPacket) {
+    const std::string recording = gsmAttach();
+    const auto packets = linesOf(run({"decode", "--every", "packet", recording}).out);
+    ASSERT_EQ(packets.size(), 51U);
+    for (std::size_t index = 0; index < packets.size(); ++index) {
+        EXPECT_EQ(packets[index].size(), 3U);
+        EXPECT_EQ(packets[index]["packet"], index + 1);
+    }
+    const auto ticks = linesOf(run({"decode", "--every", "tick", recording}).out);
+    ASSERT_EQ(ticks.size(), 15U);
+    for (std::size_t index = 0; index < ticks.size(); ++index) {
+        EXPECT_EQ(ticks[index].size(), 3U);
+        EXPECT_EQ(ticks[index]["tick"], index + 1);
+        EXPECT_EQ(ticks[index]["display"].size(), 26U);
+    }
+    EXPECT_EQ(ticks.back()["time"], "2023-11-14T22:13:50.000Z");
+    const auto end = linesOf(run({"decode", "--every", "end", recording}).out);
+    ASSERT_EQ(end.size(), 1U);
+    EXPECT_EQ(end[0]["Process CS"]["MM State"], "MM_NULL");
+    EXPECT_EQ(end[0], ticks.back()["display"]);
+    EXPECT_EQ(end[0], packets.back()["display"]);
+}
+
 TEST_F(EndToEnd, DecodeToCsv) {
     const std::string recording =
         record("a.pcap", {{milliseconds(0), registration(0)}, {seconds(3), registration(2)}});

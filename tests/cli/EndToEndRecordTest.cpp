@@ -5,6 +5,7 @@
 
 #include <nlohmann/json.hpp>
 
+#include <algorithm>
 #include <csignal>
 #include <cstdlib>
 #include <filesystem>
@@ -240,7 +241,8 @@ TEST_F(EndToEndRecord, TsharkReadsItWithoutComplaint) {
     if (std::system("command -v tshark >/dev/null") != 0) { // NOLINT(cert-env33-c)
         GTEST_SKIP() << "tshark is not installed";
     }
-    PallaxProcess service(world, {"service", "--play", gsmAttach(), "--speed", "max"});
+    PallaxProcess service(world,
+                          {"service", "--simulate", "gsm", "--seconds", "20", "--speed", "max"});
     ASSERT_TRUE(serviceIsThere());
     const std::string file = world.path("a.pcapng");
     ASSERT_EQ(run({"record", file}).status, 0);
@@ -249,7 +251,10 @@ TEST_F(EndToEndRecord, TsharkReadsItWithoutComplaint) {
                                 world.path("names") + " 2> " + said;
     EXPECT_EQ(std::system(command.c_str()), 0); // NOLINT(cert-env33-c)
     EXPECT_EQ(doubles::contentOf(said).find("tshark: "), std::string::npos);
-    EXPECT_TRUE(doubles::contentOf(world.path("names")).starts_with("Zorell_GSM\n"));
+    const std::string names = doubles::contentOf(world.path("names"));
+    EXPECT_TRUE(names.starts_with("Zorell_GSM\n"));
+    EXPECT_EQ(std::count(names.begin(), names.end(), '\n'), packetsIn(file));
+    EXPECT_GT(packetsIn(file), 100);
     end(service);
 }
 

@@ -3,6 +3,10 @@
 #include "tests/cli/EndToEnd.h"
 
 #include <csignal>
+#include <filesystem>
+#include <fstream>
+#include <set>
+#include <sstream>
 
 // A service that simulates a modem for viewers and recorders alike.
 
@@ -49,6 +53,21 @@ protected:
     }
 };
 
+/// The sockets that a process has open, by the kernel's numbers.
+std::vector<std::string> socketsOf(pid_t process) {
+    std::vector<std::string> numbers;
+    const std::string folder = "/proc/" + std::to_string(process) + "/fd";
+    for (const auto& each : std::filesystem::directory_iterator(folder)) {
+        std::error_code gone;
+        const std::string target = std::filesystem::read_symlink(each.path(), gone);
+        constexpr std::string_view kSocket = "socket:[";
+        if (target.starts_with(kSocket)) {
+            numbers.push_back(target.substr(kSocket.size(), target.size() - kSocket.size() - 1));
+        }
+    }
+    return numbers;
+}
+
 TEST_F(EndToEndSimulatedService, ARecordingOfEachModemShowsTickByTickWhatTheViewerShowed) {
     for (const RecordedTechnology* each : simulatedTechnologies()) {
         SCOPED_TRACE(each->commandName);
@@ -63,6 +82,50 @@ TEST_F(EndToEndSimulatedService, ARecordingOfEachModemShowsTickByTickWhatTheView
         EXPECT_TRUE(shown == printed(file)) << shown;
         end(modem);
     }
+}
+
+TEST_F(EndToEndSimulatedService, ASignalEndsItAndItsSocketsAreRemoved) {
+    for (const int number : {SIGINT, SIGTERM}) {
+        PallaxProcess modem(world, {"service", "--simulate", "lte"});
+        ASSERT_TRUE(serviceIsThere());
+        PallaxProcess viewer(world, {"--print"});
+        EXPECT_TRUE(viewer.says("== "));
+        modem.signal(number);
+        EXPECT_EQ(modem.wait(), 0);
+        EXPECT_EQ(modem.err(), "");
+        end(viewer);
+        EXPECT_EQ(world.sockets(), std::vector<std::string>());
+    }
+}
+
+TEST_F(EndToEndSimulatedService, NobodyOpensASocketOfTheNetwork) {
+    PallaxProcess modem(world, {"service", "--simulate", "lte"});
+    ASSERT_TRUE(serviceIsThere());
+    PallaxProcess viewer(world, {"--print"});
+    PallaxProcess recorder(world, {"record", world.path("a.pcapng")});
+    EXPECT_TRUE(viewer.says("== "));
+    EXPECT_TRUE(eventually([this] { return std::filesystem::exists(world.path("a.pcapng")); }));
+    for (const PallaxProcess* each : {&modem, &viewer, &recorder}) {
+        // Its seventh column is the number of the socket.
+        std::ifstream table("/proc/" + std::to_string(each->id()) + "/net/unix");
+        std::set<std::string> local;
+        for (std::string line; std::getline(table, line);) {
+            std::istringstream columns(line);
+            std::string column;
+            for (int count = 0; count < 7; ++count) {
+                columns >> column;
+            }
+            local.insert(column);
+        }
+        const auto open = socketsOf(each->id());
+        EXPECT_GE(open.size(), 2U) << "one that listens, one to the other side";
+        for (const std::string& number : open) {
+            EXPECT_TRUE(local.contains(number)) << "socket " << number;
+        }
+    }
+    end(viewer);
+    end(recorder);
+    end(modem);
 }
 
 TEST_F(EndToEndSimulatedService, SoItIsWhenThePacketsComeInTheirTime) {

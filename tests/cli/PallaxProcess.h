@@ -56,6 +56,8 @@ public:
     PallaxProcess(const PallaxProcess&) = delete;
     PallaxProcess& operator=(const PallaxProcess&) = delete;
 
+    /// While it runs.
+    pid_t id() const { return _process; }
     /// The exit status; minus the signal's number when a signal ended it. Fails a test and kills
     /// the process when it does not end within 20 seconds.
     int wait();

@@ -112,9 +112,25 @@ TEST_F(PcapNgWriterTest, ATechnologyIsOneInterface) {
     const auto writer = create();
     EXPECT_EQ(*writer->interfaceFor(148, "Zorell_GSM"), 0U);
     EXPECT_EQ(*writer->interfaceFor(kZorellLte, "Zorell_LTE"), 1U);
-    const auto size = writer->size();
+    const auto size = static_cast<std::size_t>(writer->size());
     EXPECT_EQ(*writer->interfaceFor(148, "Zorell_GSM"), 0U);
-    EXPECT_EQ(writer->size(), size);
+    EXPECT_EQ(writer->size(), size) << "written once";
+    ASSERT_EQ(writer->write(1, kStamp, {}), std::nullopt);
+    ASSERT_EQ(writer->write(0, kStamp, {}), std::nullopt);
+    using namespace std::string_literals;
+    const auto interface = [](std::string_view linkType, std::string_view name) {
+        return "\x01\0\0\0\x30\0\0\0"s.append(linkType) +
+               "\0\0\0\0\0\x04\0\x02\0\x0A\0"s.append(name) +
+               "\0\0\x09\0\x01\0\x09\0\0\0\0\0\0\0\x30\0\0\0"s;
+    };
+    const auto packet = [](std::string_view number) {
+        return "\x06\0\0\0\x20\0\0\0"s.append(number) +
+               "\0\0\0\xFE\x9C\x97\x17\x15\xCD\x85\x3D\0\0\0\0\0\0\0\0\x20\0\0\0"s;
+    };
+    constexpr std::size_t kSectionHeader = 44;
+    EXPECT_EQ(doubles::contentOf(path).substr(kSectionHeader),
+              interface("\x94"s, "Zorell_GSM") + interface("\x96"s, "Zorell_LTE") +
+                  packet("\x01"s) + packet("\0"s));
 }
 
 TEST_F(PcapNgWriterTest, ATimeBefore1970IsWrittenAs1970) {

@@ -94,11 +94,9 @@ TEST_P(PropertyListFiles, HoldsItsContent) {
     EXPECT_EQ(valueOf(parsePropertyList(bytesOf(*serializeXml(list)))), list);
 }
 
-TEST_P(PropertyListFiles, ATruncatedCopyIsRefused) {
+TEST_P(PropertyListFiles, ACopyTruncatedAtAnyLengthIsRefused) {
     const ByteBuffer bytes = bytesOf(contentOf(path(".bplist")));
-    constexpr std::size_t kMostCuts = 1000;
-    const std::size_t step = std::max<std::size_t>(1, bytes.size() / kMostCuts);
-    for (std::size_t length = 0; length < bytes.size(); length += step) {
+    for (std::size_t length = 0; length < bytes.size(); ++length) {
         // A copy of its own, so that a sanitizer sees a read past the cut.
         const ByteBuffer cut(bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(length));
         EXPECT_FALSE(parseBinaryPropertyList(cut)) << length << " bytes";

@@ -14,12 +14,12 @@ using namespace doubles; // NOLINT: the vocabulary of these tests
 using GsmNeighborFixture = RecordFixture<GSMNeighbhorMeasurements>;
 using Lines = std::vector<RecordingLog::Line>;
 
-Record neighbours(unsigned count) {
+Record gsmNeighbours(unsigned count) {
     return Record(0xD00E).padTo(16).u8(count);
 }
 
 PropertyList onlyCell(std::initializer_list<unsigned> entry) {
-    const Record record = neighbours(1).append(entry);
+    const Record record = gsmNeighbours(1).append(entry);
     const Array cells = GSMNeighbhorMeasurements::cellsOf(LogRecord(record.bytes()));
     return cells.size() == 1 ? cells[0] : PropertyList();
 }
@@ -32,7 +32,7 @@ TEST(GSMNeighbhorMeasurements, OwnsTheGSMNeighborCellListAndSubscribesTo0xD00E) 
 }
 
 TEST(GSMNeighbhorMeasurements, TheListIsBuiltAndDroppedSoThatTheSectionIsEmptied) {
-    const Record record = neighbours(2)
+    const Record record = gsmNeighbours(2)
                               .append({0x2A, 0xC1, 3, 5, 0x56, 0, 0xB0, 0xFF})
                               .append({0x2B, 0x81, 4, 6, 0x57, 0, 0xB1, 0xFF});
     EXPECT_EQ(GSMNeighbhorMeasurements::cellsOf(LogRecord(record.bytes())).size(), 2U);
@@ -80,7 +80,7 @@ TEST(GSMNeighbhorMeasurements, TheBandIndicatorIsBit6OfByte1AndTheValidityBit7) 
 }
 
 TEST(GSMNeighbhorMeasurements, CellsAreReadUpToTheFirstThatIsNotWhole) {
-    const Record record = neighbours(255).padTo(17 + 5 * 8);
+    const Record record = gsmNeighbours(255).padTo(17 + 5 * 8);
     for (std::size_t length = 17; length <= record.bytes().size(); ++length) {
         const ByteBuffer cut(record.bytes().begin(),
                              record.bytes().begin() + static_cast<std::ptrdiff_t>(length));
@@ -96,9 +96,9 @@ TEST(GSMNeighbhorMeasurements, AShortPacketOrAnotherCodeChangesNothingSilently) 
         EXPECT_EQ(fixture.lines, (Lines{{4, "GSM Neighbor Cell List"}}));
         EXPECT_EQ(fixture.section(), PropertyList(Array{"what was shown before"}));
     }
-    fixture.feed(neighbours(0));
+    fixture.feed(gsmNeighbours(0));
     EXPECT_TRUE(fixture.list().empty()) << "17 bytes are enough";
-    cutAtEveryLength<GSMNeighbhorMeasurements>(neighbours(3).padTo(17 + 24), 17);
+    cutAtEveryLength<GSMNeighbhorMeasurements>(gsmNeighbours(3).padTo(17 + 24), 17);
 }
 
 TEST(GSMNeighbhorMeasurements, AnyBytesKeepItsSectionEmpty) {

@@ -22,7 +22,7 @@ constexpr std::uint32_t packed(unsigned uarfcn, unsigned cellId, unsigned rscp, 
 }
 
 /// Every byte that is not read is set.
-Record neighbours(const std::vector<std::uint32_t>& cells) {
+Record utranNeighbours(const std::vector<std::uint32_t>& cells) {
     Record record(0xD00A);
     while (record.bytes().size() < kEntries) {
         record.u8(0xFF);
@@ -36,7 +36,7 @@ Record neighbours(const std::vector<std::uint32_t>& cells) {
 
 std::string shown(std::uint32_t cell, std::string_view key) {
     UtranNeighborFixture fixture;
-    fixture.feed(neighbours({cell}));
+    fixture.feed(utranNeighbours({cell}));
     if (fixture.list().size() != 1) {
         return "(no single cell)";
     }
@@ -53,7 +53,7 @@ TEST(UTRANNeighbhorMeasurements, OwnsTheNeighborCellListAndSubscribesTo0xD00A) {
 
 TEST(UTRANNeighbhorMeasurements, ShowsEveryCellWithItsKeysInOrder) {
     UtranNeighborFixture fixture;
-    fixture.feed(neighbours({packed(10713, 97, 128, 1, 1), packed(10688, 5, 255, 0, 0)}));
+    fixture.feed(utranNeighbours({packed(10713, 97, 128, 1, 1), packed(10688, 5, 255, 0, 0)}));
     EXPECT_EQ(fixture.lines, (Lines{{4, "NeighbhorMeasurements List"}}));
     ASSERT_EQ(fixture.list().size(), 2U);
     expectInOrder(fixture.list()[0], Dictionary{{"UARFCN", "10713"},
@@ -129,11 +129,11 @@ TEST(UTRANNeighbhorMeasurements, AShortPacketOrAnotherCodeChangesNothingSilently
         EXPECT_EQ(fixture.lines, (Lines{{4, "NeighbhorMeasurements List"}}));
         EXPECT_EQ(fixture.section(), PropertyList(Array{"what was shown before"}));
     }
-    cutAtEveryLength<UTRANNeighbhorMeasurements>(neighbours({1, 2, 3}), 21);
+    cutAtEveryLength<UTRANNeighbhorMeasurements>(utranNeighbours({1, 2, 3}), 21);
 }
 
 TEST(UTRANNeighbhorMeasurements, TheListStopsAtTheFirstCellWhoseFourBytesAreNotWhole) {
-    const ByteBuffer bytes = neighbours({1, 2, 3}).bytes();
+    const ByteBuffer bytes = utranNeighbours({1, 2, 3}).bytes();
     for (std::size_t length = 21; length <= bytes.size(); ++length) {
         UtranNeighborFixture fixture;
         fixture.feed(

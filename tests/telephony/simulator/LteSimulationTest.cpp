@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdlib>
 #include <set>
 
 namespace pallax {
@@ -11,27 +10,24 @@ namespace {
 using std::chrono::seconds;
 
 constexpr std::uint64_t kSeeds = PALLAX_DRIVES;
-constexpr std::string_view kInfo = "Serving Cell Info";
-constexpr std::string_view kIdle = "Serving Cell Measurements";
-constexpr std::string_view kConnected = "Connected mode LTE Intra-frequency Measurement";
+constexpr std::string_view kInfoSection = "Serving Cell Info";
+constexpr std::string_view kIdleSection = "Serving Cell Measurements";
+constexpr std::string_view kConnectedSection = "Connected mode LTE Intra-frequency Measurement";
 
 std::uint32_t codeOf(Bytes message) {
     return LogPacketGetLogCode(LogRecord(LogPacketStripPrefix(message)));
 }
 
-double numberIn(const std::string& text) {
-    return std::strtod(text.c_str(), nullptr);
-}
-
-/// What holds after each packet of any drive.
-void expectConsistent(const DecodedDisplay& decoded, std::uint32_t code) {
-    const std::string serving = decoded.text(kInfo, "Physical Cell ID");
+/// What holds after each packet of any drive; the number of neighbours that were compared.
+std::size_t expectConsistent(const DecodedDisplay& decoded, std::uint32_t code) {
+    const std::string serving = decoded.text(kInfoSection, "Physical Cell ID");
     std::vector<std::string> neighbours;
     if (code == 0xB17F) {
-        EXPECT_EQ(decoded.text(kIdle, "Physical Cell ID"), serving);
-        EXPECT_EQ(decoded.text(kIdle, "E-ARFCN"), decoded.text(kInfo, "Download Frequency"));
+        EXPECT_EQ(decoded.text(kIdleSection, "Physical Cell ID"), serving);
+        EXPECT_EQ(decoded.text(kIdleSection, "E-ARFCN"),
+                  decoded.text(kInfoSection, "Download Frequency"));
     } else if (code == 0xB179) {
-        EXPECT_EQ(decoded.text(kConnected, "Serving Physical Cell ID"), serving);
+        EXPECT_EQ(decoded.text(kConnectedSection, "Serving Physical Cell ID"), serving);
         neighbours = decoded.texts("Measured Neighbor Cells", "Physical Cell ID");
         const auto detected = decoded.texts("Detected Cells", "Physical Cell ID");
         neighbours.insert(neighbours.end(), detected.begin(), detected.end());
@@ -45,6 +41,7 @@ void expectConsistent(const DecodedDisplay& decoded, std::uint32_t code) {
         << "the serving cell is its own neighbour";
     EXPECT_EQ(std::set<std::string>(neighbours.begin(), neighbours.end()).size(), neighbours.size())
         << "a neighbour comes twice";
+    return neighbours.size();
 }
 
 TEST(LteSimulation, TheRecordsAgreeAboutTheServingCellAndItsNeighbours) {
@@ -54,17 +51,19 @@ TEST(LteSimulation, TheRecordsAgreeAboutTheServingCellAndItsNeighbours) {
         SimulationOptions options = simulationOf("lte", seed, seconds(60));
         options.packetsPerSecond = 5;
         Simulation simulation(options);
+        std::size_t neighbours = 0;
         while (const auto packet = simulation.next()) {
-            const std::string before = decoded.text(kInfo, "Physical Cell ID");
-            const std::string identity = decoded.text(kInfo, "Cell Identity");
+            const std::string before = decoded.text(kInfoSection, "Physical Cell ID");
+            const std::string identity = decoded.text(kInfoSection, "Cell Identity");
             decoded.feed(packet->data);
             const std::uint32_t code = codeOf(packet->data);
-            expectConsistent(decoded, code);
+            neighbours += expectConsistent(decoded, code);
             if (code == 0xFF0001) { // tells the same as the identity record before it
-                EXPECT_EQ(decoded.text(kInfo, "Physical Cell ID"), before);
-                EXPECT_EQ(decoded.text(kInfo, "Cell Identity"), identity);
+                EXPECT_EQ(decoded.text(kInfoSection, "Physical Cell ID"), before);
+                EXPECT_EQ(decoded.text(kInfoSection, "Cell Identity"), identity);
             }
         }
+        EXPECT_GT(neighbours, 0U);
     }
 }
 
@@ -87,14 +86,14 @@ TEST(LteSimulation, LevelsAreInRangeAndMoveSmoothlyWhileOneCellServes) {
                 continue;
             }
             const double level_dbm =
-                numberIn(code == 0xB17F ? decoded.text(kIdle, "Measured RSRP")
-                                        : decoded.text(kConnected, "Serving Filtered RSRP"));
+                numberOf(code == 0xB17F ? decoded.text(kIdleSection, "Measured RSRP")
+                                        : decoded.text(kConnectedSection, "Serving Filtered RSRP"));
             const double quality_db =
-                numberIn(code == 0xB17F ? decoded.text(kIdle, "Measured RSRQ")
-                                        : decoded.text(kConnected, "Serving Filtered RSRQ"));
+                numberOf(code == 0xB17F ? decoded.text(kIdleSection, "Measured RSRQ")
+                                        : decoded.text(kConnectedSection, "Serving Filtered RSRQ"));
             EXPECT_TRUE(level_dbm >= -125 && level_dbm <= -40) << level_dbm;
             EXPECT_TRUE(quality_db >= -20 && quality_db <= -3) << quality_db;
-            const std::string serving = decoded.text(kInfo, "Physical Cell ID");
+            const std::string serving = decoded.text(kInfoSection, "Physical Cell ID");
             if (serving == cell && packet->time - lastTime < Scenario::kStep) {
                 EXPECT_LE(std::abs(level_dbm - last_dbm), kLargestStepDb);
             }
@@ -115,8 +114,8 @@ TEST(LteSimulation, InTenMinutesThePhoneVisitsManyCellsAndCandidatesOfEveryTechn
     std::set<std::string> areas;
     while (const auto packet = simulation.next()) {
         decoded.feed(packet->data);
-        cells.insert(decoded.text(kInfo, "Physical Cell ID"));
-        areas.insert(decoded.text(kInfo, "Tracking Area Code"));
+        cells.insert(decoded.text(kInfoSection, "Physical Cell ID"));
+        areas.insert(decoded.text(kInfoSection, "Tracking Area Code"));
         for (const std::string& each :
              decoded.texts("Reselection Candidates List", "Candidate RAT Type")) {
             technologies.insert(each);
