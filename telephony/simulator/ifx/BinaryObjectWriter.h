@@ -35,8 +35,9 @@ public:
     void endArray();
     void key(Word word) { _open[_depth].keys.add(static_cast<std::size_t>(word)); }
     void text(Word word) { _open[_depth].values.add(static_cast<std::size_t>(word)); }
-    void text(std::string_view text);
-    void text(const ShortText& text);
+    /// Of numbers and letters, together no more than kLongestShortText.
+    template <class... Parts>
+    void shortText(const Parts&... parts);
     /// The message; the writer has done its work.
     void finish(ByteBuffer& out);
 
@@ -107,10 +108,11 @@ inline std::uint8_t* putMarker(MessageBuffer& out, binary_form::Kind kind, std::
 inline std::uint8_t* BinaryObjectWriter::References::putTo(std::uint8_t* place) const {
     constexpr unsigned kBitsPerByte = 8;
     static_assert(kMostInContainer <= kShortPiece);
+    const References own = *this; // which no byte that is set can change: so it becomes one store
     for (unsigned byte = 0; byte < kMostInContainer; ++byte) {
-        place[byte] = static_cast<std::uint8_t>(bytes >> (kBitsPerByte * byte));
+        place[byte] = static_cast<std::uint8_t>(own.bytes >> (kBitsPerByte * byte));
     }
-    return place + count;
+    return place + own.count;
 }
 
 /// The place of its content.
@@ -127,14 +129,17 @@ inline void BinaryObjectWriter::endObject() {
     _open[_depth].values.add(_objects++);
 }
 
-inline void BinaryObjectWriter::text(const ShortText& text) {
-    const std::size_t size = text.view().size();
-    copyShortPiece(beginObject(binary_form::kAscii, size, size), text.view().data());
-    endObject();
-}
-
-inline void BinaryObjectWriter::text(std::string_view text) {
-    std::ranges::copy(text, beginObject(binary_form::kAscii, text.size(), text.size()));
+template <class... Parts>
+void BinaryObjectWriter::shortText(const Parts&... parts) {
+    constexpr unsigned kHalfByte = 4;
+    std::uint8_t* marker = _message.roomFor(1 + kLongestShortText);
+    const std::size_t length = putShortText(marker + 1, parts...);
+    if (length >= binary_form::kCountFollows) {
+        refuseMessage();
+    }
+    *marker = static_cast<std::uint8_t>(unsigned{binary_form::kAscii} << kHalfByte | length);
+    _offsets.putNumber(_message.size(), kOffsetWidth);
+    _message.take(1 + length);
     endObject();
 }
 

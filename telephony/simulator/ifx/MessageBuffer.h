@@ -43,13 +43,18 @@ public:
     }
     /// The place of so many more bytes, which the caller sets.
     std::uint8_t* room(std::size_t count) {
-        if (count > kCapacity - _size) {
-            refuseMessage();
-        }
-        std::uint8_t* place = _bytes.data() + _size;
+        std::uint8_t* place = roomFor(count);
         _size += count;
         return place;
     }
+    /// A place where so many bytes may be set; those that `take` then counts are put.
+    std::uint8_t* roomFor(std::size_t count) {
+        if (count > kCapacity - _size) {
+            refuseMessage();
+        }
+        return _bytes.data() + _size;
+    }
+    void take(std::size_t count) { _size += count; }
     Bytes bytes() const { return Bytes(_bytes).first(_size); }
 
 private:

@@ -1,7 +1,6 @@
 #include "telephony/simulator/ifx/Picture.h"
 
 #include "telephony/simulator/ifx/BinaryObjectWriter.h"
-#include "telephony/simulator/ifx/ShortText.h"
 #include "telephony/simulator/ifx/XmlObjectWriter.h"
 
 namespace pallax::ifx {
@@ -57,31 +56,30 @@ public:
     }
 
 private:
-    template <class Text>
-    void wrapped(Word key, const Text& text) {
+    void wrapped(Word key, Word value) {
         _writer.beginDictionary();
-        _writer.key(key);
-        _writer.text(text);
+        entry(key, value);
         _writer.endDictionary();
     }
     void entry(Word key, Word value) {
         _writer.key(key);
         _writer.text(value);
     }
-    void entry(Word key, const ShortText& value) {
-        _writer.key(key);
-        _writer.text(value);
-    }
     template <class Number>
     void entry(Word key, Number number) {
-        entry(key, ShortText(number));
+        _writer.key(key);
+        _writer.shortText(number);
     }
     void bsic(ColourCode code) {
-        entry(Word::Bsic, ShortText(code.network).then(",").then(code.station));
+        _writer.key(Word::Bsic);
+        _writer.shortText(code.network, std::string_view(","), code.station);
     }
     void level(Word key, int level_dbm) {
         _writer.key(key);
-        wrapped(Word::Value, ShortText(level_dbm).then(" dBm"));
+        _writer.beginDictionary();
+        _writer.key(Word::Value);
+        _writer.shortText(level_dbm, std::string_view(" dBm"));
+        _writer.endDictionary();
     }
 
     void network(bool isRegistered);
@@ -156,7 +154,7 @@ void Teller<Writer>::dedicated(const DedicatedChannel& channel) {
         _writer.beginArray();
         _writer.text(Word::HoppingHeader);
         for (const unsigned arfcn : channel.hopping) {
-            _writer.text(ShortText(arfcn));
+            _writer.shortText(arfcn);
         }
         _writer.endArray();
     }

@@ -4,6 +4,7 @@
 #include "telephony/simulator/ifx/ShortText.h"
 #include "telephony/simulator/ifx/Words.h"
 
+#include <array>
 #include <cstddef>
 #include <string_view>
 
@@ -21,15 +22,29 @@ public:
     void beginArray() { begin("<array>\n"); }
     void endArray() { end("</array>\n"); }
     void key(Word word) { element("<key>", textOf(word), "</key>\n"); }
-    void text(Word word) { text(textOf(word)); }
-    void text(const ShortText& text) { this->text(text.view()); }
-    void text(std::string_view text) { element("<string>", text, "</string>\n"); }
+    void text(Word word) { element("<string>", textOf(word), "</string>\n"); }
+    /// Of numbers and letters, together no more than kLongestShortText.
+    template <class... Parts>
+    void shortText(const Parts&... parts) {
+        line("<string>");
+        _message.take(putShortText(_message.roomFor(kLongestShortText), parts...));
+        _message.put(std::string_view("</string>\n"));
+    }
     /// The message; the writer has done its work.
     void finish(ByteBuffer& out);
 
 private:
     void line(std::string_view text) {
-        _message.fill(_depth, '\t');
+        static constexpr auto kTabs = [] {
+            std::array<char, kShortPiece> tabs{};
+            tabs.fill('\t');
+            return tabs;
+        }();
+        if (_depth > kTabs.size()) {
+            refuseMessage();
+        }
+        copyShortPiece(_message.roomFor(_depth), kTabs.data());
+        _message.take(_depth);
         _message.put(text);
     }
     void begin(std::string_view tag) {

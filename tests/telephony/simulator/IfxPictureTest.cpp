@@ -132,13 +132,13 @@ TEST(IfxPicture, ItsFormsHoldTheSameAndItsXmlIsThatOfTheSerialiser) {
 TEST(IfxPicture, AMessageThatHoldsTooMuchIsRefused) {
     using ifx::BinaryObjectWriter;
     /// How many texts are read back of `lists` arrays that hold `count` of them each.
-    const auto writeTexts = [](std::size_t lists, std::size_t count, const std::string& text) {
+    const auto writeTexts = [](std::size_t lists, std::size_t count, const auto&... parts) {
         BinaryObjectWriter writer;
         writer.beginArray();
         for (std::size_t list = 0; list < lists; ++list) {
             writer.beginArray();
             for (std::size_t index = 0; index < count; ++index) {
-                writer.text(text);
+                writer.shortText(parts...);
             }
             writer.endArray();
         }
@@ -153,11 +153,21 @@ TEST(IfxPicture, AMessageThatHoldsTooMuchIsRefused) {
         return texts;
     };
     constexpr std::size_t kMost = BinaryObjectWriter::kMostInContainer;
-    EXPECT_EQ(writeTexts(3, kMost, "a text of more than fifteen letters"), 3 * kMost);
-    EXPECT_EQ(writeTexts(1, 0, ""), 0U);
-    EXPECT_THROW(writeTexts(1, 1, std::string(256, 'a')), std::length_error);
-    EXPECT_THROW(writeTexts(1, kMost + 1, "a"), std::length_error);
-    EXPECT_THROW(writeTexts(kMost, kMost, std::string(255, 'a')), std::length_error);
+    using Letters = std::string_view;
+    EXPECT_EQ(writeTexts(3, kMost, 12345U, Letters("nine more")), 3 * kMost);
+    EXPECT_EQ(writeTexts(1, 0, 1), 0U);
+    EXPECT_THROW(writeTexts(1, 1, Letters("eleven more")), std::length_error);
+    EXPECT_THROW(writeTexts(1, 1, 123456U, Letters("nine more")), std::length_error);
+    EXPECT_THROW(writeTexts(1, kMost + 1, 1), std::length_error);
+    BinaryObjectWriter large;
+    const auto writeLarge = [&large](auto&& self, std::size_t levels) -> void {
+        large.beginArray();
+        for (std::size_t index = 0; index < kMost; ++index) {
+            levels == 0 ? large.shortText(1) : self(self, levels - 1);
+        }
+        large.endArray();
+    };
+    EXPECT_THROW(writeLarge(writeLarge, 2), std::length_error) << "of 512 texts";
     BinaryObjectWriter deep;
     for (std::size_t depth = 0; depth < BinaryObjectWriter::kDeepest; ++depth) {
         deep.beginArray();
