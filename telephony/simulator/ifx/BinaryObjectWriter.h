@@ -107,7 +107,7 @@ inline std::uint8_t* putMarker(MessageBuffer& out, binary_form::Kind kind, std::
 /// The place behind them. All eight bytes are written, whatever their count.
 inline std::uint8_t* BinaryObjectWriter::References::putTo(std::uint8_t* place) const {
     constexpr unsigned kBitsPerByte = 8;
-    static_assert(kMostInContainer <= kShortPiece);
+    static_assert(kMostInContainer <= kLongestPiece);
     const References own = *this; // which no byte that is set can change: so it becomes one store
     for (unsigned byte = 0; byte < kMostInContainer; ++byte) {
         place[byte] = static_cast<std::uint8_t>(own.bytes >> (kBitsPerByte * byte));

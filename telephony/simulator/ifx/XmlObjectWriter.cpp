@@ -2,6 +2,9 @@
 
 namespace pallax::ifx {
 
+constinit const XmlObjectWriter::Lines XmlObjectWriter::kKeys = linesOf("<key>", "</key>\n");
+constinit const XmlObjectWriter::Lines XmlObjectWriter::kTexts = linesOf("<string>", "</string>\n");
+
 XmlObjectWriter::XmlObjectWriter() {
     _message.put("<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
                  "<plist version=\"1.0\">\n");
