@@ -84,7 +84,6 @@ std::optional<HostError> RecordingWriter::write(Time time, Bytes packet) {
     if (seconds < 0 || seconds > std::numeric_limits<std::uint32_t>::max()) {
         return HostError{"A packet before 1970 or after 2106 cannot be recorded."};
     }
-    constexpr std::size_t kBlockSize = std::size_t{1024} << 10U;
     const auto length = static_cast<std::uint32_t>(packet.size()); // captured, and as it was
     append<4>(_pending, {static_cast<std::uint32_t>(seconds),
                          static_cast<std::uint32_t>((time - second).count()), length, length});

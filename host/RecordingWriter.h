@@ -25,6 +25,9 @@ public:
 
     /// The largest packet that readers of captures accept.
     static constexpr std::size_t kLargestPacket = 262144;
+    /// From so many bytes on a block is written. A thread is begun for each: smaller ones cost
+    /// more.
+    static constexpr std::size_t kBlockSize = std::size_t{1} << 20U;
 
     /// An existing file is replaced; `path` "-" is standard output.
     static Result<std::unique_ptr<RecordingWriter>, HostError>

@@ -330,9 +330,12 @@ TEST_F(RecordingWriterTest, ABlockThatCannotBeWrittenIsToldWithTheNext) {
     ASSERT_GE(reader, 0);
     const auto writer = create("pipe", RecordingWriter::Flush::InBlocks);
     ::close(reader);
-    const ByteBuffer block(RecordingWriter::kLargestPacket);
-    EXPECT_FALSE(writer->write(kTime, block));
-    const auto error = writer->write(kTime, block);
+    const ByteBuffer packet(RecordingWriter::kLargestPacket);
+    constexpr std::size_t kPackets = RecordingWriter::kBlockSize / RecordingWriter::kLargestPacket;
+    for (std::size_t count = 0; count < 2 * kPackets - 1; ++count) {
+        EXPECT_FALSE(writer->write(kTime, packet)) << count;
+    }
+    const auto error = writer->write(kTime, packet);
     ASSERT_TRUE(error);
     EXPECT_EQ(error->sentence, "The recording " + pipe + " cannot be written: Broken pipe.");
     EXPECT_TRUE(error->readerHasGone);
