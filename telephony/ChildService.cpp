@@ -4,6 +4,8 @@
 #include "host/SocketDirectory.h"
 #include "platform/Format.h"
 
+#include <climits>
+
 #include <algorithm>
 #include <array>
 #include <cerrno>
@@ -15,6 +17,7 @@
 #include <sys/prctl.h>
 #include <sys/wait.h>
 #include <thread>
+#include <unistd.h>
 #include <vector>
 
 namespace pallax {
@@ -115,6 +118,16 @@ std::optional<SimulationOptions> simulationOf(const std::vector<std::string>& ar
     return simulation;
 }
 
+/// This program again. By its path, for lists of processes name it after that (and memory checkers
+/// follow it); where an update has replaced the file since, by what runs.
+void startAgain(char* const* arguments) {
+    std::array<char, PATH_MAX> path{};
+    if (::readlink("/proc/self/exe", path.data(), path.size() - 1) > 0) {
+        (void)::execv(path.data(), arguments);
+    }
+    (void)::execv("/proc/self/exe", arguments);
+}
+
 /// In the child, between fork and exec: only what is safe there, and it does not return.
 [[noreturn]] void becomeService(pid_t parent, char* const* arguments, bool readsInput, int ready,
                                 int complaints) {
@@ -128,7 +141,7 @@ std::optional<SimulationOptions> simulationOf(const std::vector<std::string>& ar
     // Ctrl-C at the terminal goes to its whole group; when the child ends is the viewer's to say.
     (void)::setpgid(0, 0);
     if (wired && ::prctl(PR_SET_PDEATHSIG, SIGTERM) == 0 && ::getppid() == parent) {
-        (void)::execv("/proc/self/exe", arguments);
+        startAgain(arguments);
     }
     ::_exit(kExecFailed);
 }

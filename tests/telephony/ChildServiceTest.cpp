@@ -5,6 +5,7 @@
 
 #include <csignal>
 #include <fcntl.h>
+#include <sstream>
 #include <sys/wait.h>
 
 namespace pallax {
@@ -68,6 +69,18 @@ TEST_F(ChildServiceTest, ServesARecordingAndLeavesNothingBehind) {
     EXPECT_EQ(_folder.socketCount(), 0U);
     EXPECT_EQ(service->takeComplaints(), "");
     EXPECT_EQ(::waitpid(-1, nullptr, WNOHANG), -1); // no child is left
+}
+
+TEST_F(ChildServiceTest, ListsOfProcessesNameItAfterTheProgram) {
+    const auto nameOf = [](const std::string& process) {
+        return doubles::contentOf("/proc/" + process + "/comm");
+    };
+    const auto service = start(recordLte(_folder, 1));
+    ASSERT_NE(service, nullptr);
+    std::istringstream children(doubles::contentOf("/proc/thread-self/children"));
+    std::string child;
+    ASSERT_TRUE(children >> child);
+    EXPECT_EQ(nameOf(child), nameOf("self"));
 }
 
 TEST_F(ChildServiceTest, SeveralRunSideBySide) {
