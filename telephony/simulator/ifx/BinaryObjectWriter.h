@@ -35,7 +35,7 @@ public:
     void endArray();
     void key(Word word) { _open[_depth].keys.add(static_cast<std::size_t>(word)); }
     void text(Word word) { _open[_depth].values.add(static_cast<std::size_t>(word)); }
-    /// Of numbers and letters, together no more than kLongestShortText.
+    /// Of numbers and letters, together less than fifteen: their count stands in the marker.
     template <class... Parts>
     void shortText(const Parts&... parts);
     /// The message; the writer has done its work.
