@@ -121,7 +121,11 @@ void appendValue(std::string& out, const PropertyList& object, int depth) {
         appendStringValue(out, object);
         return;
     case Type::kInteger:
-        appendNumber(out, *object.integer());
+        if (const auto large = object.largeInteger()) {
+            appendNumber(out, *large);
+        } else {
+            appendNumber(out, *object.integer());
+        }
         return;
     case Type::kReal:
         appendReal(out, *object.real());

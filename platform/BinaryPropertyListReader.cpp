@@ -242,8 +242,8 @@ PropertyList BinaryReader::singleton(std::uint64_t offset, const Marker& marker)
     }
 }
 
-/// Of 1, 2 or 4 bytes unsigned; of 8 bytes signed; of 16 bytes signed too, and read where 8 would
-/// have done.
+/// Of 1, 2 or 4 bytes unsigned; of 8 bytes signed; of 16 bytes signed too, and read when 64 bits
+/// hold the number, with or without a sign.
 PropertyList BinaryReader::integer(std::uint64_t offset, const Marker& marker) const {
     if (marker.low > kSixteenBytes) {
         refuse(offset, "an integer wider than 16 bytes");
@@ -255,11 +255,15 @@ PropertyList BinaryReader::integer(std::uint64_t offset, const Marker& marker) c
         refuse(offset, "an object that goes past the end of the objects");
     }
     const auto number = std::bit_cast<std::int64_t>(*low);
-    if (wide) {
-        const std::uint64_t high = *_objects.number(marker.content, kWidestNumber);
-        if (high != (number < 0 ? std::numeric_limits<std::uint64_t>::max() : 0)) {
-            refuse(offset, "an integer beyond 64 bits");
-        }
+    if (!wide) {
+        return PropertyList::integer(number);
+    }
+    const std::uint64_t high = *_objects.number(marker.content, kWidestNumber);
+    if (high == 0) {
+        return PropertyList::unsignedInteger(*low);
+    }
+    if (high != std::numeric_limits<std::uint64_t>::max() || number >= 0) {
+        refuse(offset, "an integer beyond 64 bits");
     }
     return PropertyList::integer(number);
 }

@@ -43,6 +43,13 @@ void appendInteger(std::string& out, std::int64_t number) {
     appendNumber(out, bits, std::size_t{1} << power);
 }
 
+/// In 16 bytes, for 8 would be read as a negative number.
+void appendLargeInteger(std::string& out, std::uint64_t number) {
+    appendMarker(out, kInteger, kSixteenBytes);
+    appendNumber(out, 0, kWidestNumber);
+    appendNumber(out, number, kWidestNumber);
+}
+
 void appendCounted(std::string& out, Kind kind, std::size_t count) {
     if (count < kCountFollows) {
         appendMarker(out, kind, count);
@@ -107,6 +114,8 @@ std::string encodedScalar(const PropertyList& object) {
     }
     if (const auto integer = object.integer()) {
         appendInteger(out, *integer);
+    } else if (const auto large = object.largeInteger()) {
+        appendLargeInteger(out, *large);
     } else if (const auto real = object.real()) {
         return encodedReal(kReal, *real);
     } else if (const auto truth = object.boolean()) {

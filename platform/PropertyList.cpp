@@ -72,6 +72,8 @@ void describe(std::string& out, const PropertyList& object) {
         out += dateText(*date);
     } else if (const auto integer = object.integer()) {
         out += std::to_string(*integer);
+    } else if (const auto large = object.largeInteger()) {
+        out += std::to_string(*large);
     } else if (const auto real = object.real()) {
         out += formatText("%f", {*real});
     } else if (const auto truth = object.boolean()) {
@@ -94,14 +96,21 @@ PropertyList::PropertyList(Array elements) : _value(std::make_shared<Array>(std:
 PropertyList::PropertyList(Dictionary entries)
     : _value(std::make_shared<Dictionary>(std::move(entries))) {}
 
+PropertyList PropertyList::unsignedInteger(std::uint64_t number) {
+    constexpr auto kLargestSigned =
+        static_cast<std::uint64_t>(std::numeric_limits<std::int64_t>::max());
+    return number <= kLargestSigned ? integer(static_cast<std::int64_t>(number))
+                                    : PropertyList(Value(number));
+}
+
 PropertyList PropertyList::data(ByteBuffer bytes) {
     return {std::make_shared<const ByteBuffer>(std::move(bytes))};
 }
 
 PropertyList::Type PropertyList::type() const {
-    constexpr std::array kTypes = {Type::kNull,  Type::kString,    Type::kString, Type::kInteger,
-                                   Type::kReal,  Type::kBoolean,   Type::kData,   Type::kDate,
-                                   Type::kArray, Type::kDictionary};
+    constexpr std::array kTypes = {Type::kNull,  Type::kString,     Type::kString, Type::kInteger,
+                                   Type::kReal,  Type::kBoolean,    Type::kData,   Type::kDate,
+                                   Type::kArray, Type::kDictionary, Type::kInteger};
     static_assert(kTypes.size() == std::variant_size_v<Value>);
     return kTypes.at(_value.index());
 }

@@ -66,6 +66,7 @@ public:
     PropertyList(Dictionary entries);
 
     static PropertyList integer(std::int64_t number) { return PropertyList(Value(number)); }
+    static PropertyList unsignedInteger(std::uint64_t number);
     static PropertyList real(double number) { return PropertyList(Value(number)); }
     static PropertyList boolean(bool truth) { return PropertyList(Value(truth)); }
     static PropertyList data(ByteBuffer bytes);
@@ -86,6 +87,8 @@ public:
     const DisplayNumber* displayNumber() const { return std::get_if<DisplayNumber>(&_value); }
 
     std::optional<std::int64_t> integer() const { return get<std::int64_t>(); }
+    /// An integer that only 64 bits without a sign can hold; nothing for every other value.
+    std::optional<std::uint64_t> largeInteger() const { return get<std::uint64_t>(); }
     std::optional<double> real() const { return get<double>(); }
     std::optional<bool> boolean() const { return get<bool>(); }
     std::optional<Date> date() const { return get<Date>(); }
@@ -121,7 +124,7 @@ public:
 
 private:
     using Value = std::variant<std::monostate, Text, DisplayNumber, std::int64_t, double, bool,
-                               SharedBytes, Date, ArrayRef, DictionaryRef>;
+                               SharedBytes, Date, ArrayRef, DictionaryRef, std::uint64_t>;
     explicit PropertyList(Value value) : _value(std::move(value)) {}
 
     template <class T>

@@ -47,7 +47,7 @@ bool takeSign(std::string_view& text) {
     return negative;
 }
 
-std::int64_t parseInteger(std::size_t offset, std::string_view text) {
+PropertyList parseInteger(std::size_t offset, std::string_view text) {
     std::string_view digits = trimmed(text);
     const bool negative = takeSign(digits);
     const bool hexadecimal = digits.starts_with("0x") || digits.starts_with("0X");
@@ -59,11 +59,13 @@ std::int64_t parseInteger(std::size_t offset, std::string_view text) {
     if (error == std::errc::invalid_argument || end != last) {
         refuse(offset, "an integer that is no number");
     }
-    constexpr auto kLargest = static_cast<std::uint64_t>(std::numeric_limits<std::int64_t>::max());
-    if (error != std::errc() || magnitude > kLargest + (negative ? 1 : 0)) {
+    constexpr auto kMostNegative = std::uint64_t{1} << 63U;
+    if (error != std::errc() || (negative && magnitude > kMostNegative)) {
         refuse(offset, "an integer beyond 64 bits");
     }
-    return std::bit_cast<std::int64_t>(negative ? std::uint64_t{0} - magnitude : magnitude);
+    return negative
+               ? PropertyList::integer(std::bit_cast<std::int64_t>(std::uint64_t{0} - magnitude))
+               : PropertyList::unsignedInteger(magnitude);
 }
 
 /// "nan", "inf" and "infinity" in any case; nothing for everything else.
@@ -199,7 +201,7 @@ PropertyList XmlReader::scalar(pugi::xml_node element, std::string_view name) co
         return textOf(element);
     }
     if (name == "integer") {
-        return PropertyList::integer(parseInteger(offsetOf(element), textOf(element)));
+        return parseInteger(offsetOf(element), textOf(element));
     }
     if (name == "real") {
         return PropertyList::real(parseReal(offsetOf(element), textOf(element)));

@@ -128,6 +128,8 @@ void XmlWriter::scalar(const PropertyList& object) {
         textElement("string", *text);
     } else if (const auto integer = object.integer()) {
         element("integer", std::to_string(*integer));
+    } else if (const auto large = object.largeInteger()) {
+        element("integer", std::to_string(*large));
     } else if (const auto real = object.real()) {
         element("real", realText(*real));
     } else if (const auto truth = object.boolean()) {

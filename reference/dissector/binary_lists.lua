@@ -91,16 +91,18 @@ local function binary_text(source, marker)
   return bytes
 end
 
--- Of 1, 2 or 4 bytes unsigned, of 8 signed; of 16 where 8 would have done.
+-- Of 1, 2 or 4 bytes unsigned, of 8 signed; of 16 when 64 bits hold the number, with or without a
+-- sign.
 local function binary_integer(source, marker)
   if marker.low > 4 then refuse() end
-  local at, width = marker.content, 2 ^ marker.low
+  local at, width, is_unsigned = marker.content, 2 ^ marker.low, false
   marker.past = at + width
   if width == 16 then
     local high = source.bytes:sub(at + 1, at + 8)
     width, at = 8, at + 8
-    local sign = big_endian(source, at, 1, source.objects_end) >= 128 and "\255" or "\0"
-    if high ~= string.rep(sign, 8) then refuse() end
+    local is_top_bit_set = big_endian(source, at, 1, source.objects_end) >= 128
+    is_unsigned = high == string.rep("\0", 8)
+    if not is_unsigned and (high ~= string.rep("\255", 8) or not is_top_bit_set) then refuse() end
   end
   if width < 8 then
     local number = big_endian(source, at, width, source.objects_end)
@@ -108,8 +110,10 @@ local function binary_integer(source, marker)
   end
   -- In halves, and the text in another way: a number of Lua may not hold all of the bits.
   local low = big_endian(source, at + 4, 4, source.objects_end)
-  local high = signed(big_endian(source, at, 4, source.objects_end), 32)
-  return high * 2 ^ 32 + low, tostring(source.range:range(at, 8):int64())
+  local high = big_endian(source, at, 4, source.objects_end)
+  local range = source.range:range(at, 8)
+  if is_unsigned then return high * 2 ^ 32 + low, tostring(range:uint64()) end
+  return signed(high, 32) * 2 ^ 32 + low, tostring(range:int64())
 end
 
 local function binary_real(source, marker)

@@ -56,7 +56,7 @@ local function integer_of(text)
   end
   digits = digits:gsub("^0+(%d)", "%1")
   sign = sign == "-" and digits ~= "0" and "-" or ""
-  local largest = sign == "-" and "9223372036854775808" or "9223372036854775807"
+  local largest = sign == "-" and "9223372036854775808" or "18446744073709551615"
   if #digits > #largest or #digits == #largest and digits > largest then refuse() end
   return tonumber(sign .. digits), sign .. digits
 end

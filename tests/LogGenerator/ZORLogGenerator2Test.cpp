@@ -123,6 +123,12 @@ TEST_F(ZORLogGenerator2Test, TheCallThatBuildsTheDisplayReturnsNull) {
     EXPECT_EQ(_generator.getDisplayFromState(_state), kEmptyDisplay);
 }
 
+TEST_F(ZORLogGenerator2Test, TheFirstDisplayGeneratedOfAFreshStateIsNull) {
+    EXPECT_TRUE(_generator.generateLogUsingState(_state).isNull());
+    EXPECT_EQ(_generator.generateLogUsingState(_state), kEmptyDisplay);
+    EXPECT_EQ(_state.find("History")->array()->size(), 2U);
+}
+
 TEST_F(ZORLogGenerator2Test,
        ARecordOf13BytesWithType0xFFAndCode0x0020ReachesTheSubscribersOf0xFF0020) {
     feed(Record(0xFF0020).bytes());

@@ -65,6 +65,11 @@ TEST_F(ZORLogGeneratorTest, TheHeaderNamesBuildTimeAndZone) {
     EXPECT_EQ(textAt(dlf, 85, 4), std::string("\x78\x00\x01\x00", 4)); // 120 minutes, summer
 }
 
+TEST_F(ZORLogGeneratorTest, TheFractionOfTheSecondIsDiscarded) {
+    _fixture.clock.advance(std::chrono::milliseconds(999));
+    EXPECT_EQ(textAt(dlfOf({}), 81, 4), std::string("\x00\xF1\x53\x65", 4)); // 1700000000
+}
+
 TEST_F(ZORLogGeneratorTest, AZoneIsRoundedTowardZeroMinutes) {
     _fixture.clock.setZone({std::chrono::seconds(-12599), false});
     EXPECT_EQ(textAt(dlfOf({}), 85, 4), std::string("\x2F\xFF\x00\x00", 4)); // -209

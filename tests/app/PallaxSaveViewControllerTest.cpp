@@ -25,6 +25,24 @@ PropertyList entry(const char* description) {
                       {"Description", description}};
 }
 
+/// Notes each log line among what is done on the screen.
+class DiaryLog final : public LogSink {
+public:
+    explicit DiaryLog(ScreenDiary& diary) : _diary(diary) {
+        SystemLog::setSink(this, SystemLog::kEverything);
+    }
+    ~DiaryLog() override { SystemLog::setSink(nullptr); }
+    DiaryLog(const DiaryLog&) = delete;
+    DiaryLog& operator=(const DiaryLog&) = delete;
+
+    void write(LogPriority priority, std::string_view /*text*/) override {
+        _diary.push_back("log " + std::to_string(static_cast<int>(priority)));
+    }
+
+private:
+    ScreenDiary& _diary;
+};
+
 class PallaxSaveViewControllerTest : public testing::Test {
 protected:
     std::unique_ptr<PallaxSaveViewController> open(const PropertyList& saveHistory) {
@@ -265,6 +283,15 @@ TEST_F(PallaxSaveViewControllerTest, AFailedWriteIsLoggedAndAlertedAndTheScreenC
     queue.runReady();
     EXPECT_EQ(closes, 1);
     EXPECT_TRUE(files.files.empty());
+}
+
+TEST_F(PallaxSaveViewControllerTest, AFailedWriteIsLoggedBeforeItIsAlerted) {
+    files.failWrite = true;
+    const auto made = open(two);
+    toolkit.take();
+    DiaryLog noted(toolkit.diary);
+    made->savePressed();
+    EXPECT_EQ(toolkit.take(), (ScreenDiary{"log 3", "alert File Error"}));
 }
 
 TEST_F(PallaxSaveViewControllerTest, CancelClosesOnTheQueueAndWritesNothing) {

@@ -38,11 +38,13 @@ TEST(DisplayJson, WritesEveryTypeOfAPropertyList) {
         {"inf", PropertyList::real(-std::numeric_limits<double>::infinity())},
         {"true", PropertyList::boolean(true)},
         {"false", PropertyList::boolean(false)},
+        {"large", PropertyList::unsignedInteger(18446744073709551615U)},
         {"data", PropertyList::data({0x0F, 0xBD, 0x77, 0xFF})},
         {"date", Date(std::chrono::seconds(1700000000))},
     };
     EXPECT_EQ(json(object), R"({"null":null,"integer":-9223372036854775808,"real":0.1,"whole":-3,)"
-                            R"("nan":null,"inf":null,"true":true,"false":false,"data":"D713/w==",)"
+                            R"("nan":null,"inf":null,"true":true,"false":false,)"
+                            R"("large":18446744073709551615,"data":"D713/w==",)"
                             R"("date":"2023-11-14T22:13:20Z"})");
 }
 

@@ -33,6 +33,33 @@ TEST_F(EndToEndScreen, PanesOpenThreeLevelsDeepAndCloseAgain) {
     expectNothingLeft();
 }
 
+TEST_F(EndToEndScreen, APaneWhoseSectionVanishesGoesBackToTheDeepestThatIsStillThere) {
+    constexpr int kObjectStream = 147;
+    const auto message = [](const char* text) {
+        const std::string_view all = text;
+        return ByteBuffer(all.begin(), all.end());
+    };
+    const std::string recording = record(
+        "vanishing.pcap",
+        {{std::chrono::seconds(0), message("{ SIM = { Files = { A = 1; B = 2; }; State = in; };"
+                                           " Cell = { ARFCN = 1; BSIC = 2; }; }")},
+         {std::chrono::seconds(41), message("{ SIM = { State = out; PIN = no; };"
+                                            " Cell = { ARFCN = 1; BSIC = 2; }; }")}},
+        kObjectStream);
+    PallaxTerminal terminal(world, {recording, "--speed", "10"}, {});
+    ASSERT_TRUE(terminal.shows("SIM"));
+    terminal.type("/sim\r\r");
+    ASSERT_TRUE(terminal.shows("Pallax › SIM"));
+    terminal.type("/files\r\r");
+    ASSERT_TRUE(terminal.shows("Pallax › SIM › Files"));
+    EXPECT_TRUE(terminal.showsNoMore("› Files"));
+    EXPECT_TRUE(terminal.shows("Pallax › SIM"));
+    terminal.type(kEscape); // the filter of the pane that has come back
+    EXPECT_TRUE(terminal.shows("PIN"));
+    terminal.type("qq");
+    EXPECT_EQ(terminal.wait(), 0);
+}
+
 TEST_F(EndToEndScreen, AValueThatChangesWhileOneLooksIsMarkedForOneTick) {
     PallaxTerminal terminal(world, {changing(), "--speed", "4"}, {});
     ASSERT_TRUE(terminal.shows("Process CO"));

@@ -9,10 +9,13 @@
 
 namespace pallax::doubles {
 
-/// A registry of one local and one remote port, scripted by its public fields. It keeps a diary
-/// of what was done to the ports and outlives them.
+/// A registry of one local and one remote port, scripted by its public fields. It notes in a diary,
+/// its own or one that it shares with other fakes, what was done to the ports, and outlives them.
 class FakePorts final : public MessagePorts {
 public:
+    explicit FakePorts(std::vector<std::string>* shared = nullptr)
+        : diary(shared != nullptr ? *shared : _diary) {}
+
     /// A request as it was sent, with its own copy of the data.
     struct SentRequest {
         RemoteMessagePort::Request request;
@@ -26,7 +29,7 @@ public:
     bool failRemote = false;  ///< no living port has the remote name
     Answer answer;            ///< answers every request; without it all succeed unanswered
     std::vector<SentRequest> requests;
-    std::vector<std::string> diary; ///< "local NAME", "invalidate local", "release remote", …
+    std::vector<std::string>& diary; ///< "local NAME", "invalidate local", "release remote", …
 
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override;
@@ -142,6 +145,7 @@ private:
         }
     };
 
+    std::vector<std::string> _diary;
     LocalPort* _local = nullptr;
     RemotePort* _remote = nullptr;
     std::vector<std::optional<ByteBuffer>> _replies;

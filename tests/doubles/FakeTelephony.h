@@ -7,13 +7,17 @@
 
 namespace pallax::doubles {
 
-/// A telephony service that answers as its public fields say and keeps a diary.
+/// A telephony service that answers as its public fields say and keeps a diary, its own or one that
+/// it shares with other fakes.
 class FakeTelephony final : public TelephonyService {
 public:
+    explicit FakeTelephony(std::vector<std::string>* shared = nullptr)
+        : diary(shared != nullptr ? *shared : _diary) {}
+
     bool reachable = true;
     LogChannel channel{0, 0, "modem"};   ///< what every request for a log channel gives
     std::function<void()> duringChannel; ///< called while a log channel is being created
-    std::vector<std::string> diary;      ///< "connect", "channel LOCALPORT", "release"
+    std::vector<std::string>& diary;     ///< "connect", "channel LOCALPORT", "release connection"
 
     std::unique_ptr<HXServerConnection> connect(std::function<void()> notification) override {
         diary.emplace_back("connect");
@@ -38,7 +42,7 @@ private:
     public:
         explicit Connection(FakeTelephony& service) : _service(service) {}
         ~Connection() override {
-            _service.diary.emplace_back("release");
+            _service.diary.emplace_back("release connection");
             _service._notification = nullptr;
         }
         Connection(const Connection&) = delete;
@@ -57,6 +61,7 @@ private:
         FakeTelephony& _service;
     };
 
+    std::vector<std::string> _diary;
     std::function<void()> _notification;
 };
 

@@ -107,7 +107,7 @@ TEST(FakeTelephony, NotifiesWhileTheConnectionLives) {
     connection.reset();
     EXPECT_FALSE(telephony.notify());
     EXPECT_EQ(notices, 1);
-    EXPECT_EQ(telephony.diary, (Diary{"connect", "channel local", "release"}));
+    EXPECT_EQ(telephony.diary, (Diary{"connect", "channel local", "release connection"}));
     telephony.reachable = false;
     EXPECT_EQ(telephony.connect({}), nullptr);
 }

@@ -30,7 +30,40 @@ public:
     }
 };
 
-/// A model among fakes. The modem answers GetTechnology as `reply` says, first with "Fake".
+/// The timers of a queue, which are noted in a diary: "start timer", "end timer".
+class NotedTimers final : public TimerScheduler {
+public:
+    NotedTimers(TimerScheduler& timers, std::vector<std::string>& diary)
+        : _timers(timers), _diary(diary) {}
+
+    std::unique_ptr<RepeatingTimer> scheduleRepeating(std::chrono::nanoseconds interval,
+                                                      std::function<void()> action) override {
+        _diary.emplace_back("start timer");
+        return std::make_unique<Timer>(_timers.scheduleRepeating(interval, std::move(action)),
+                                       _diary);
+    }
+
+private:
+    class Timer final : public RepeatingTimer {
+    public:
+        Timer(std::unique_ptr<RepeatingTimer> timer, std::vector<std::string>& diary)
+            : _timer(std::move(timer)), _diary(diary) {}
+        void invalidate() override {
+            _diary.emplace_back("end timer");
+            _timer->invalidate();
+        }
+
+    private:
+        std::unique_ptr<RepeatingTimer> _timer;
+        std::vector<std::string>& _diary;
+    };
+
+    TimerScheduler& _timers;
+    std::vector<std::string>& _diary;
+};
+
+/// A model among fakes, whose ports, telephony service and timers share one diary. The modem
+/// answers GetTechnology as `reply` says, first with "Fake".
 class ModelFixture : public testing::Test {
 protected:
     using Lines = std::vector<RecordingLog::Line>;
@@ -89,7 +122,7 @@ protected:
     /// How often local ports were asked for.
     std::size_t starts() const {
         return static_cast<std::size_t>(
-            std::count(ports.diary.begin(), ports.diary.end(),
+            std::count(linkDiary.begin(), linkDiary.end(),
                        "local com.norvane.BasebandStateReport.LogChannel"));
     }
 
@@ -97,9 +130,11 @@ protected:
     FakeResources resources;
     FakeBundle bundle;
     FakeStandardOutput standardOutput;
-    FakePorts ports;
-    FakeTelephony telephony;
+    Diary linkDiary;
+    FakePorts ports{&linkDiary};
+    FakeTelephony telephony{&linkDiary};
     SteppedQueue queue;
+    NotedTimers timers{queue, linkDiary};
     CountingObserver observer;
     RecordingLog log;
     Outcome reply = technology("Fake");
@@ -107,7 +142,7 @@ protected:
     PallaxModel::Platform platform{.ports = ports,
                                    .telephony = telephony,
                                    .queue = queue,
-                                   .timers = queue,
+                                   .timers = timers,
                                    .generators = {clock, resources, bundle, standardOutput},
                                    .technologies = kFakeTechnologies,
                                    .observer = observer};

@@ -45,6 +45,20 @@ TEST_F(HostFilesTest, APropertyListIsWrittenAsXmlAndAFailureIsTold) {
     EXPECT_FALSE(files.writePropertyList("/dev/full", object));
 }
 
+TEST_F(HostFilesTest, APropertyListIsWrittenInPlace) {
+    HostFileSystem files;
+    const std::string path = _folder.write("a.pallax", std::string(4096, 'x'));
+    struct stat before {};
+    ASSERT_EQ(::stat(path.c_str(), &before), 0);
+    ASSERT_TRUE(files.writePropertyList(path, PropertyList("tunnel")));
+    struct stat after {};
+    ASSERT_EQ(::stat(path.c_str(), &after), 0);
+    EXPECT_EQ(after.st_ino, before.st_ino) << "no other file takes its place";
+    EXPECT_TRUE(doubles::contentOf(path).starts_with("<?xml version=\"1.0\" encoding=\"UTF-8\"?>"))
+        << doubles::contentOf(path);
+    EXPECT_EQ(parsed("a.pallax"), PropertyList("tunnel"));
+}
+
 TEST_F(HostFilesTest, WhatCannotBeSerialisedLeavesTheFileAlone) {
     HostFileSystem files;
     (void)_folder.write("a.pallax", "before");

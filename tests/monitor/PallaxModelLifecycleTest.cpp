@@ -8,18 +8,20 @@ using doubles::FakeGenerator;
 
 class PallaxModelLifecycleTest : public doubles::ModelFixture {
 protected:
+    const Diary kTeardown = {"end timer",     "clear callback of local",  "invalidate local",
+                             "release local", "clear callback of remote", "invalidate remote",
+                             "release remote"};
+
     static std::string invalidated(const MessagePort* port) {
         return formatText(" ***** INVALIDATED %p *****", {static_cast<const void*>(port)});
     }
 };
 
-TEST_F(PallaxModelLifecycleTest, ATeardownEndsLocalThenRemotePortAndClearsEachCallbackFirst) {
+TEST_F(PallaxModelLifecycleTest, ATeardownEndsTimerThenLocalThenRemotePortEachCallbackFirst) {
     start();
-    ports.diary.clear();
+    linkDiary.clear();
     model->destroyPorts();
-    EXPECT_EQ(ports.diary,
-              (Diary{"clear callback of local", "invalidate local", "release local",
-                     "clear callback of remote", "invalidate remote", "release remote"}));
+    EXPECT_EQ(linkDiary, kTeardown);
     EXPECT_FALSE(model->isConnected());
 }
 
@@ -91,7 +93,7 @@ TEST_F(PallaxModelLifecycleTest, TheTimerOfTheRestartCountsItsOwn2Seconds) {
 TEST_F(PallaxModelLifecycleTest, ARefreshWithoutPortsChecksNothing) {
     model->refresh();
     EXPECT_TRUE(log.lines().empty());
-    EXPECT_TRUE(ports.diary.empty());
+    EXPECT_EQ(linkDiary, Diary{});
 }
 
 TEST_F(PallaxModelLifecycleTest, ARefreshRestartsFirstAndThenTellsOfNewData) {
@@ -162,12 +164,10 @@ TEST_F(PallaxModelLifecycleTest, TheStateSurvivesRestarts) {
 
 TEST_F(PallaxModelLifecycleTest, TheEndOfTheModelTearsEverythingDownWithoutARestart) {
     start();
-    ports.diary.clear();
+    linkDiary.clear();
     log.take();
     model.reset();
-    EXPECT_EQ(ports.diary,
-              (Diary{"clear callback of local", "invalidate local", "release local",
-                     "clear callback of remote", "invalidate remote", "release remote"}));
+    EXPECT_EQ(linkDiary, kTeardown);
     EXPECT_TRUE(FakeGenerator::living.empty());
     EXPECT_TRUE(log.lines().empty());
 }

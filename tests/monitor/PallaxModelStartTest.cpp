@@ -10,18 +10,17 @@ class PallaxModelStartTest : public doubles::ModelFixture {};
 
 TEST_F(PallaxModelStartTest, NothingStartsWithTheModelItself) {
     queue.advance(60s);
-    EXPECT_TRUE(ports.diary.empty());
-    EXPECT_TRUE(telephony.diary.empty());
+    EXPECT_EQ(linkDiary, Diary{});
     EXPECT_TRUE(log.lines().empty());
     EXPECT_FALSE(model->isConnected());
 }
 
 TEST_F(PallaxModelStartTest, AStartMakesPortsChannelAndGeneratorInThisOrder) {
     start();
-    EXPECT_EQ(ports.diary, (Diary{"local com.norvane.BasebandStateReport.LogChannel",
-                                  "set queue of local", "set callback of local", "remote modem"}));
-    EXPECT_EQ(telephony.diary,
-              (Diary{"connect", "channel com.norvane.BasebandStateReport.LogChannel", "release"}));
+    EXPECT_EQ(linkDiary, (Diary{"local com.norvane.BasebandStateReport.LogChannel",
+                                "set queue of local", "set callback of local", "connect",
+                                "channel com.norvane.BasebandStateReport.LogChannel",
+                                "release connection", "remote modem", "start timer"}));
     EXPECT_TRUE(model->isConnected());
 }
 

@@ -3,6 +3,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <array>
 #include <cmath>
 
@@ -48,11 +49,25 @@ TEST(BinaryPropertyListReader, ReadsIntegersOfEveryWidth) {
     EXPECT_EQ(read({minusOne}), PropertyList::integer(-1));
 }
 
+TEST(BinaryPropertyListReader, ReadsIntegersThatNeed64BitsWithoutASign) {
+    const PropertyList least = read({{0x14, 0, 0, 0, 0, 0, 0, 0, 0, 0x80, 0, 0, 0, 0, 0, 0, 0}});
+    EXPECT_EQ(least, PropertyList::unsignedInteger(9223372036854775808U));
+    EXPECT_EQ(least.integer(), std::nullopt);
+    EXPECT_EQ(least.int32(), std::nullopt);
+    EXPECT_EQ(least.description(), "9223372036854775808");
+    ByteBuffer most(17, 0xFF);
+    std::fill(most.begin(), most.begin() + 9, std::uint8_t{0});
+    most[0] = 0x14;
+    EXPECT_EQ(read({most}).largeInteger(), 18446744073709551615U);
+}
+
 TEST(BinaryPropertyListReader, RefusesIntegersBeyond64Bits) {
     EXPECT_EQ(refusal({{0x14, 0, 0, 0, 0, 0, 0, 0, 1, 0, 0, 0, 0, 0, 0, 0, 7}}),
               "at byte 8: an integer beyond 64 bits");
-    EXPECT_EQ(refusal({{0x14, 0, 0, 0, 0, 0, 0, 0, 0, 0x80, 0, 0, 0, 0, 0, 0, 0}}),
-              "at byte 8: an integer beyond 64 bits");
+    ByteBuffer belowTheLeast(17, 0xFF);
+    belowTheLeast[0] = 0x14;
+    belowTheLeast[9] = 0x7F;
+    EXPECT_EQ(refusal({belowTheLeast}), "at byte 8: an integer beyond 64 bits");
     EXPECT_EQ(refusal({{0x15}}), "at byte 8: an integer wider than 16 bytes");
 }
 

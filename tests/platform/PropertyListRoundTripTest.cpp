@@ -70,6 +70,8 @@ rc::Gen<PropertyList> scalars(Reach reach) {
     return rc::gen::oneOf(
         strings, data, rc::gen::map(fullRange(rc::gen::arbitrary<std::int64_t>()), integer),
         rc::gen::map(fullRange(rc::gen::inRange<std::int64_t>(-300, 70000)), integer),
+        rc::gen::map(fullRange(rc::gen::arbitrary<std::uint64_t>()),
+                     [](std::uint64_t number) { return PropertyList::unsignedInteger(number); }),
         rc::gen::map(fullRange(rc::gen::arbitrary<std::uint64_t>()), real),
         rc::gen::map(rc::gen::arbitrary<bool>(), boolean),
         rc::gen::map(fullRange(rc::gen::inRange<std::int64_t>(kYear0, kYear10000)), date));

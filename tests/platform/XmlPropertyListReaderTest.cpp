@@ -105,8 +105,10 @@ TEST(XmlPropertyListReader, ReadsIntegersOf64Bits) {
     EXPECT_EQ(integer("-0X10"), PropertyList::integer(-16));
     EXPECT_EQ(integer("9223372036854775807"), PropertyList::integer(INT64_MAX));
     EXPECT_EQ(integer("-9223372036854775808"), PropertyList::integer(INT64_MIN));
-    for (const char* text : {"9223372036854775808", "-9223372036854775809", "99999999999999999999",
-                             "0x8000000000000000"}) {
+    EXPECT_EQ(integer("9223372036854775808"), PropertyList::unsignedInteger(9223372036854775808U));
+    EXPECT_EQ(integer("0xFFFFFFFFFFFFFFFF"), PropertyList::unsignedInteger(UINT64_MAX));
+    for (const char* text : {"18446744073709551616", "-9223372036854775809", "99999999999999999999",
+                             "0x10000000000000000"}) {
         EXPECT_EQ(refusalOfValue("<integer>" + std::string(text) + "</integer>"),
                   "at byte 0: an integer beyond 64 bits");
     }

@@ -171,6 +171,15 @@ TEST(CellNumber, BeyondThe32BitRangeThereIsNone) {
     expectNoNumber(Dictionary{{"number", PropertyList::real(-2147483649.0)}});
 }
 
+TEST(CellNumber, OneBeyond64BitsWithASignLeavesTheRestOfTheListReadable) {
+    const PropertyList large = PropertyList::unsignedInteger(9223372036854775808U);
+    const Array cells = {servingCell(310), Dictionary{{"number", large}}};
+    EXPECT_EQ(cellsOf(propertyListRecord(kCellMonitor, cells)), PropertyList(cells));
+    const auto xml = serializeXml(PropertyList(cells));
+    EXPECT_EQ(cellsOf(textRecord(kCellMonitor, *xml)), PropertyList(cells));
+    expectNoNumber(Dictionary{{"number", large}});
+}
+
 TEST(CellNumber, ARealCountsWhenItIsWhole) {
     expectNumber(PropertyList::real(-40.0), -40);
     expectNumber(PropertyList::real(2147483647.0), 2147483647);
