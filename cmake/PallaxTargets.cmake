@@ -54,9 +54,8 @@ endfunction()
 # little; the tests around it would only take longer to build.
 set(pallax_library_level $<$<BOOL:${PALLAX_COVERAGE}>:-O1>)
 
-# Parsing these headers took most of the time of compiling a source without optimization. What
-# users run is built without, and so is the core alone: a source that leaves an include out fails
-# there.
+# Parsing these headers takes most of the time of compiling a source. The preset "core" builds
+# without them: a source of the core that leaves an include out fails there.
 if(PALLAX_PRECOMPILE)
     file(WRITE ${PROJECT_BINARY_DIR}/precompiled.cpp "")
     add_library(pallax_precompiled STATIC ${PROJECT_BINARY_DIR}/precompiled.cpp)
