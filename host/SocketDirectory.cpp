@@ -5,16 +5,20 @@
 #include "platform/Format.h"
 
 #include <cerrno>
+#include <chrono>
 #include <cstdlib>
 #include <cstring>
 #include <fcntl.h>
 #include <filesystem>
 #include <sys/file.h>
 #include <sys/stat.h>
+#include <thread>
 
 namespace pallax {
 
 namespace {
+
+constexpr std::chrono::milliseconds kLockLook{5};
 
 std::string placeOfDirectory() {
     const char* runtime = std::getenv("XDG_RUNTIME_DIR"); // NOLINT(concurrency-mt-unsafe)
@@ -58,21 +62,27 @@ Result<std::string, HostError> SocketDirectory::socketPath(std::string_view name
     if (name.empty()) {
         return HostError{"A message port needs a name."};
     }
-    std::string path = _path + "/" + fileNameFor(name);
-    if (path.size() > longestSocketPath()) {
+    const std::string file = fileNameFor(name);
+    if (file.size() > longestSocketName()) {
         return HostError{formatText("The name of the message port %@ is too long: its socket's "
-                                    "path would have %zu bytes, and %zu is the most.",
-                                    {name, path.size(), longestSocketPath()})};
+                                    "name would have %zu bytes, and %zu is the most.",
+                                    {name, file.size(), longestSocketName()})};
     }
-    return path;
+    return _path + "/" + file;
 }
 
 Descriptor SocketDirectory::lock() const {
+    using std::chrono::steady_clock;
     Descriptor folder(::open(_path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    int locked = -1;
-    while (folder && (locked = ::flock(folder.number(), LOCK_EX)) != 0 && errno == EINTR) {
+    const auto end = steady_clock::now() + kLockPatience;
+    while (folder && ::flock(folder.number(), LOCK_EX | LOCK_NB) != 0) {
+        if ((errno != EWOULDBLOCK && errno != EINTR) || steady_clock::now() >= end) {
+            folder.reset();
+        } else {
+            std::this_thread::sleep_for(kLockLook);
+        }
     }
-    return locked == 0 ? std::move(folder) : Descriptor();
+    return folder;
 }
 
 void SocketDirectory::removeStaleSockets() const {

@@ -45,7 +45,8 @@ struct SocketLocalPort::State : std::enable_shared_from_this<State> {
     }
     void acceptAll();
     void remove(const Session* session);
-    /// Ends every connection and removes the socket's file, if it is still ours.
+    /// Ends every connection and removes the socket's file, if it is still ours. Nobody takes the
+    /// name over meanwhile, for the listener lives until the state ends: no lock is needed.
     void close();
 
     Setup setup;
@@ -108,7 +109,6 @@ void SocketLocalPort::State::remove(const Session* session) {
 
 void SocketLocalPort::State::close() {
     sessions.clear();
-    const Descriptor held = setup.directory.lock();
     if (identityOf(setup.path) == identity) {
         (void)::unlink(setup.path.c_str());
     }

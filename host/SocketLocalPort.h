@@ -1,7 +1,6 @@
 #pragma once
 
 #include "host/Descriptor.h"
-#include "host/SocketDirectory.h"
 #include "platform/MessagePort.h"
 
 #include <memory>
@@ -18,7 +17,6 @@ class SocketLocalPort final : public LocalMessagePort {
 public:
     struct Setup {
         AsioMainQueue& queue;
-        SocketDirectory directory;
         std::string path;
         Descriptor listener; ///< listens at `path`
         MessagePorts::ReceiveCallback receive;

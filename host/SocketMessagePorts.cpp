@@ -6,10 +6,28 @@
 #include "platform/Format.h"
 
 #include <cerrno>
+#include <cstdio>
 #include <cstring>
 #include <unistd.h>
 
 namespace pallax {
+
+namespace {
+
+/// Removes a stale socket without the lock. Another process may have replaced it by a living one
+/// since it was found stale; that one is put back.
+void moveAside(const std::string& path, const std::string& folder) {
+    const std::string aside = folder + formatText("/stale.%d", {::getpid()});
+    if (::rename(path.c_str(), aside.c_str()) != 0) {
+        return;
+    }
+    if (listenerAt(aside) == Listener::Living) {
+        (void)::link(aside.c_str(), path.c_str());
+    }
+    (void)::unlink(aside.c_str());
+}
+
+} // namespace
 
 SocketMessagePorts::SocketMessagePorts(AsioMainQueue& queue, SocketDirectory directory,
                                        SourceTimeListener* listener)
@@ -23,21 +41,27 @@ MessagePorts::Local SocketMessagePorts::createLocal(std::string_view name,
         return {};
     }
     const Descriptor held = _directory.lock();
-    const Listener present = held ? listenerAt(*path) : Listener::None;
+    const Listener present = listenerAt(*path);
     if (present == Listener::Living) {
         return {std::make_unique<SocketLocalPort>(), true};
     }
-    if (present == Listener::Stale) {
+    if (present == Listener::Stale && held) {
         (void)::unlink(path->c_str());
+    } else if (present == Listener::Stale) {
+        moveAside(*path, _directory.path());
     }
     Descriptor listener = listenAt(*path);
+    const int error = listener ? 0 : errno;
+    if (error == EADDRINUSE && listenerAt(*path) == Listener::Living) {
+        return {std::make_unique<SocketLocalPort>(), true};
+    }
     if (!listener) {
         _lastError = formatText("The message port %@ cannot be made at %@: %@.",
-                                {name, *path, std::strerror(errno)});
+                                {name, *path, std::strerror(error)});
         return {};
     }
     return {std::make_unique<SocketLocalPort>(SocketLocalPort::Setup{
-                _queue, _directory, *path, std::move(listener), std::move(receive), _listener}),
+                _queue, *path, std::move(listener), std::move(receive), _listener}),
             false};
 }
 
@@ -48,6 +72,11 @@ std::unique_ptr<RemoteMessagePort> SocketMessagePorts::createRemote(std::string_
         return nullptr;
     }
     return std::make_unique<SocketRemotePort>(_queue, std::move(socket));
+}
+
+bool SocketMessagePorts::isTaken(std::string_view name) const {
+    const auto path = _directory.socketPath(name);
+    return path && listenerAt(*path) == Listener::Living;
 }
 
 } // namespace pallax

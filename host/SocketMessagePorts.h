@@ -22,6 +22,8 @@ public:
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override;
 
+    /// Whether a living port has that name, even one that takes no connection now.
+    bool isTaken(std::string_view name) const;
     /// Why the latest createLocal gave no port: one sentence.
     const std::string& lastError() const { return _lastError; }
     const SocketDirectory& directory() const { return _directory; }

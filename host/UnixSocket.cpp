@@ -3,7 +3,10 @@
 #include <array>
 #include <cerrno>
 #include <cstring>
+#include <fcntl.h>
+#include <limits>
 #include <linux/sockios.h>
+#include <string_view>
 #include <sys/ioctl.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
@@ -17,21 +20,53 @@ namespace {
 constexpr int kSocketType = SOCK_STREAM | SOCK_NONBLOCK | SOCK_CLOEXEC;
 constexpr int kBacklog = 64;
 
-/// Nothing when the path is too long.
-std::optional<sockaddr_un> addressOf(const std::string& path) {
-    sockaddr_un address{};
-    if (path.size() > longestSocketPath()) {
-        errno = ENAMETOOLONG;
-        return std::nullopt;
-    }
-    address.sun_family = AF_UNIX;
-    std::memcpy(static_cast<void*>(address.sun_path), path.c_str(), path.size() + 1);
-    return address;
-}
+constexpr std::size_t kLongestAddress = sizeof(sockaddr_un::sun_path) - 1;
+constexpr std::string_view kDescriptors = "/proc/self/fd/";
+constexpr std::size_t kMostDigits = std::numeric_limits<int>::digits10 + 1; // of a descriptor
 
-const sockaddr* generic(const sockaddr_un& address) {
-    return static_cast<const sockaddr*>(static_cast<const void*>(&address));
-}
+/// The address of a socket's path. A path that has no room in an address is reached through a
+/// descriptor of its folder.
+class Address {
+public:
+    explicit Address(const std::string& path) {
+        if (path.size() <= kLongestAddress) {
+            take(path);
+            return;
+        }
+        const std::size_t slash = path.rfind('/');
+        if (slash == std::string::npos) {
+            errno = ENAMETOOLONG;
+            return;
+        }
+        const std::string folder = path.substr(0, slash);
+        _folder = Descriptor(::open(folder.c_str(), O_PATH | O_DIRECTORY | O_CLOEXEC));
+        if (_folder) {
+            take(std::string(kDescriptors) + std::to_string(_folder.number()) + path.substr(slash));
+        }
+    }
+
+    /// False with errno set where no address leads to the path.
+    explicit operator bool() const { return _isWhole; }
+    const sockaddr* generic() const {
+        return static_cast<const sockaddr*>(static_cast<const void*>(&_address));
+    }
+    static constexpr socklen_t size() { return sizeof(sockaddr_un); }
+
+private:
+    void take(const std::string& text) {
+        if (text.size() > kLongestAddress) {
+            errno = ENAMETOOLONG;
+            return;
+        }
+        _address.sun_family = AF_UNIX;
+        std::memcpy(static_cast<void*>(_address.sun_path), text.c_str(), text.size() + 1);
+        _isWhole = true;
+    }
+
+    Descriptor _folder; // the address leads through it
+    sockaddr_un _address{};
+    bool _isWhole = false;
+};
 
 bool isOfThisUser(const Descriptor& socket) {
     ucred credentials{};
@@ -50,28 +85,28 @@ Transfer outcome(ssize_t moved) {
 
 } // namespace
 
-std::size_t longestSocketPath() {
-    return sizeof(sockaddr_un::sun_path) - 1;
+std::size_t longestSocketName() {
+    return kLongestAddress - kDescriptors.size() - kMostDigits - 1; // and a slash
 }
 
 Listener listenerAt(const std::string& path) {
-    const auto address = addressOf(path);
+    const Address address(path);
     const Descriptor probe(::socket(AF_UNIX, kSocketType, 0));
     if (!address || !probe) {
         return Listener::None;
     }
     // EAGAIN: it listens, but its queue of connections is full.
-    if (::connect(probe.number(), generic(*address), sizeof *address) == 0 || errno == EAGAIN) {
+    if (::connect(probe.number(), address.generic(), Address::size()) == 0 || errno == EAGAIN) {
         return Listener::Living;
     }
     return errno == ENOENT ? Listener::None : Listener::Stale;
 }
 
 Descriptor listenAt(const std::string& path) {
-    const auto address = addressOf(path);
+    const Address address(path);
     Descriptor listener(::socket(AF_UNIX, kSocketType, 0));
     if (!address || !listener ||
-        ::bind(listener.number(), generic(*address), sizeof *address) != 0) {
+        ::bind(listener.number(), address.generic(), Address::size()) != 0) {
         return {};
     }
     if (::chmod(path.c_str(), S_IRUSR | S_IWUSR) != 0 ||
@@ -85,10 +120,10 @@ Descriptor listenAt(const std::string& path) {
 }
 
 Descriptor connectTo(const std::string& path) {
-    const auto address = addressOf(path);
+    const Address address(path);
     Descriptor socket(::socket(AF_UNIX, kSocketType, 0));
     if (!address || !socket ||
-        ::connect(socket.number(), generic(*address), sizeof *address) != 0 ||
+        ::connect(socket.number(), address.generic(), Address::size()) != 0 ||
         !isOfThisUser(socket)) {
         return {};
     }

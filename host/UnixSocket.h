@@ -11,8 +11,8 @@
 /// Unix-domain stream sockets: never blocking, closed on exec, without SIGPIPE.
 namespace pallax {
 
-/// The longest path that a socket can have, in bytes.
-std::size_t longestSocketPath();
+/// The longest name that a socket can have in any folder, in bytes.
+std::size_t longestSocketName();
 
 /// Whether somebody listens at `path`, as a connection attempt finds it.
 enum class Listener { Living, Stale, None };

@@ -89,15 +89,26 @@ TEST_F(SocketDirectoryTest, APortsNameBecomesOnePathComponent) {
     EXPECT_EQ(directory->socketPath("").error().sentence, "A message port needs a name.");
 }
 
-TEST_F(SocketDirectoryTest, APathTooLongForASocketIsAnError) {
+TEST_F(SocketDirectoryTest, ANameTooLongForASocketIsAnError) {
     const auto directory = SocketDirectory::open();
     ASSERT_TRUE(directory);
-    const std::size_t room = longestSocketPath() - directory->path().size() - 1;
-    EXPECT_TRUE(directory->socketPath(std::string(room, 'a')));
-    const std::string name(room + 1, 'a');
+    EXPECT_TRUE(directory->socketPath(std::string(82, 'a')));
+    const std::string name(83, 'a');
     EXPECT_EQ(directory->socketPath(name).error().sentence,
               "The name of the message port " + name +
-                  " is too long: its socket's path would have 108 bytes, and 107 is the most.");
+                  " is too long: its socket's name would have 83 bytes, and 82 is the most.");
+}
+
+TEST_F(SocketDirectoryTest, ALockThatAnotherKeepsIsWaitedForOnlyForAWhile) {
+    const auto directory = SocketDirectory::open();
+    ASSERT_TRUE(directory);
+    {
+        const Descriptor kept = directory->lock();
+        ASSERT_TRUE(kept);
+        EXPECT_FALSE(directory->lock());
+        directory->removeStaleSockets(); // which needs the lock, and leaves them
+    }
+    EXPECT_TRUE(directory->lock());
 }
 
 TEST_F(SocketDirectoryTest, OnlySocketsThatNobodyListensOnAreRemoved) {
