@@ -33,6 +33,7 @@ struct Relay::Feed {
 
     std::deque<Item> items;
     std::function<void()> ready;
+    std::function<void()> begun; // the relay hears it
     bool hasBegun = false;
     bool ended = false;
 };
@@ -44,7 +45,9 @@ public:
 
     std::string technology() const override { return _technology; }
     Next next() override {
-        _feed->hasBegun = true;
+        if (!std::exchange(_feed->hasBegun, true)) {
+            _queue.async(std::exchange(_feed->begun, {}));
+        }
         if (_feed->items.empty()) {
             return {_feed->ended ? State::End : State::Later, std::nullopt};
         }
@@ -74,11 +77,11 @@ Relay::Relay(Setup setup)
       _heard(_setup.steadyNow()),
       _looks(_setup.timers.scheduleRepeating(kLookInterval, [this] { look(); })),
       _alive(std::make_shared<Relay*>(this)) {
-    _setup.queue.async([weak = std::weak_ptr<Relay*>(_alive)] {
-        if (const auto relay = weak.lock()) {
-            (*relay)->step();
-        }
-    });
+    if (_setup.patience > std::chrono::nanoseconds::zero()) {
+        _setup.queue.after(_setup.patience, guarded(&Relay::begin));
+    } else {
+        _setup.queue.async(guarded(&Relay::begin));
+    }
 }
 
 Relay::~Relay() {
@@ -90,6 +93,7 @@ Relay::~Relay() {
 std::unique_ptr<PacketSource> Relay::source() {
     auto feed = std::make_shared<Feed>();
     feed->ended = _ended;
+    feed->begun = guarded(&Relay::begin);
     _feeds.push_back(feed);
     return std::make_unique<Source>(_setup.queue, _technology, std::move(feed));
 }
@@ -104,12 +108,24 @@ std::vector<std::shared_ptr<Relay::Feed>> Relay::feeds() {
     return living;
 }
 
-void Relay::step() {
-    const auto again = [weak = std::weak_ptr<Relay*>(_alive)] {
+std::function<void()> Relay::guarded(void (Relay::*member)()) {
+    return [weak = std::weak_ptr<Relay*>(_alive), member] {
         if (const auto relay = weak.lock()) {
-            (*relay)->step();
+            ((*relay)->*member)();
         }
     };
+}
+
+/// With the first source, or when the time for it is over.
+void Relay::begin() {
+    if (std::exchange(_isWaiting, false)) {
+        _heard = _setup.steadyNow();
+        step();
+    }
+}
+
+void Relay::step() {
+    const auto again = guarded(&Relay::step);
     for (int count = 0; count < kPacketsPerBlock; ++count) {
         const PacketSource::Next next = _setup.stream->next();
         if (next.state == PacketSource::State::Later) {
@@ -160,7 +176,7 @@ void Relay::finish() {
 
 void Relay::look() {
     const auto silence = _setup.steadyNow() - _heard;
-    if (!_stalled && silence >= kStall) {
+    if (!_isWaiting && !_stalled && silence >= kStall) {
         _stalled = true;
         _setup.report(formatText("The stream has stalled: no packet for %lld s.",
                                  {std::chrono::floor<std::chrono::seconds>(silence).count()}));

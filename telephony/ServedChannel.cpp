@@ -72,6 +72,7 @@ std::optional<ByteBuffer> ServedChannel::answer(Bytes request) {
     }
     const bool everything = technology == kHXLogChannelTechnology_IFX;
     if (auto filter = CodeFilter::fromStartCommand(*message, everything)) {
+        _hasStarted = true;
         _isStreaming = !_hasEnded;
         _player->play(std::move(*filter));
     }

@@ -42,6 +42,9 @@ public:
     ServedChannel& operator=(const ServedChannel&) = delete;
 
     ServiceStatus::Client status() const;
+    /// Whether the start command has come.
+    bool hasStarted() const { return _hasStarted; }
+    const std::string& receiverPortName() const { return _receiverPortName; }
     /// Bytes that were sent, and that the client has not read yet.
     std::size_t untaken() const { return _sink->untaken(); }
 
@@ -53,6 +56,7 @@ private:
     std::unique_ptr<PacketSource> _source;
     std::unique_ptr<SocketSink> _sink;
     std::string _receiverPortName;
+    bool _hasStarted = false;
     bool _isStreaming = false;
     bool _hasEnded = false;
     std::unique_ptr<PacketPlayer> _player;

@@ -74,8 +74,9 @@ Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueu
         program.makeSource = [stream] { return takeOnce(*stream); };
         return program;
     }
-    program.relay = std::make_shared<Relay>(
-        Relay::Setup{queue, queue, std::move(*stream), complain, std::move(relayEnded)});
+    Relay::Setup relay{queue, queue, std::move(*stream), complain, std::move(relayEnded)};
+    relay.patience = options.relayPatience;
+    program.relay = std::make_shared<Relay>(std::move(relay));
     program.makeSource = [relay =
                               program.relay]() -> Result<std::unique_ptr<PacketSource>, HostError> {
         return relay->source();
@@ -100,12 +101,14 @@ TelephonyServer::Setup serverSetup(const ServiceOptions& options, AsioMainQueue&
 }
 
 /// Stops the queue once the clients have heard the end and gone, or read nothing for too long: a
-/// client that sees the service gone gives up what it has not yet come to.
+/// client that sees the service gone gives up what it has not yet come to. Nobody else is served,
+/// so that the next service can start as soon as a client has heard the end.
 class LastWords {
 public:
     explicit LastWords(AsioMainQueue& queue) : _queue(queue) {}
 
-    void begin(const TelephonyServer& server) {
+    void begin(TelephonyServer& server) {
+        server.stopListening();
         _looks = _queue.scheduleRepeating(kLook, [this, &server] {
             const std::size_t untaken = server.untaken();
             _waited = untaken < _untaken ? kLook : _waited + kLook;

@@ -4,6 +4,7 @@
 #include "telephony/PacketPlayer.h"
 #include "telephony/simulator/Simulation.h"
 
+#include <chrono>
 #include <functional>
 #include <optional>
 #include <string>
@@ -13,12 +14,16 @@ namespace pallax {
 
 /// What the telephony service is to serve.
 struct ServiceOptions {
+    static constexpr std::chrono::seconds kRelayPatience{10};
+
     std::string recording; ///< path, "-" for standard input (played once, to the first channel)
     PlayOptions play;
     std::string controlPortName = std::string(kTelephonyControlPort);
     /// The recording is a live stream: it goes on to every client as it comes, and the service
     /// ends with it.
     bool relay = false;
+    /// How long what is relayed waits for its first client.
+    std::chrono::nanoseconds relayPatience = kRelayPatience;
     /// Every client sets its own pace and loses nothing, whatever the speed.
     bool lossless = false;
     std::optional<SimulationOptions> simulation = {}; ///< instead of a recording

@@ -1,7 +1,7 @@
 #include "telephony/ServiceStatus.h"
 
+#include "host/SocketMessagePorts.h"
 #include "platform/Format.h"
-#include "platform/MessagePort.h"
 #include "platform/Printable.h"
 #include "telephony/ControlMessages.h"
 
@@ -80,15 +80,21 @@ std::optional<ServiceStatus> parseStatusReply(const Dictionary& reply) {
     return status;
 }
 
-Result<ServiceStatus, HostError> askStatus(MessagePorts& ports,
+Result<ServiceStatus, HostError> askStatus(SocketMessagePorts& ports,
                                            const std::string& controlPortName) {
-    constexpr std::chrono::seconds kTimeout{5};
+    constexpr std::chrono::milliseconds kSendTimeout{500};
+    constexpr std::chrono::milliseconds kReplyTimeout{1200};
+    constexpr const char* kSilent = "The telephony service does not answer.";
     const auto port = ports.createRemote(controlPortName);
     if (port == nullptr) {
-        return HostError{"No telephony service is running."};
+        return HostError{ports.isTaken(controlPortName) ? kSilent
+                                                        : "No telephony service is running."};
     }
     const auto request = encodeMessage(statusRequest());
-    const auto outcome = port->sendRequest({0, *request, kTimeout, kTimeout, true});
+    const auto outcome = port->sendRequest({0, *request, kSendTimeout, kReplyTimeout, true});
+    if (outcome.error != SendError::None) {
+        return HostError{kSilent};
+    }
     const auto message = outcome.reply ? decodeMessage(*outcome.reply) : std::nullopt;
     const auto status = message ? parseStatusReply(*message) : std::nullopt;
     if (!status) {

@@ -11,7 +11,7 @@
 
 namespace pallax {
 
-class MessagePorts;
+class SocketMessagePorts;
 
 /// What a running service says of itself:
 ///
@@ -42,7 +42,9 @@ Dictionary statusReply(const ServiceStatus& status);
 std::optional<ServiceStatus> parseStatusReply(const Dictionary& reply);
 
 /// Asks the service behind that control port; the sentence that tells why not.
-Result<ServiceStatus, HostError> askStatus(MessagePorts& ports, const std::string& controlPortName);
+/// A service that lives and does not answer costs two seconds at most.
+Result<ServiceStatus, HostError> askStatus(SocketMessagePorts& ports,
+                                           const std::string& controlPortName);
 /// As lines for the user.
 std::string statusText(const ServiceStatus& status);
 

@@ -20,7 +20,7 @@ private:
 
 LogChannel SocketServerConnection::HXServerConnectionNetworkMonitorCreateLogChannel(
     std::string_view localPortName) {
-    constexpr std::chrono::seconds kTimeout{5};
+    constexpr std::chrono::seconds kTimeout{1};
     const auto bytes = encodeMessage(createLogChannelRequest(localPortName));
     if (!bytes) {
         return {kServiceErrorDomain, EINVAL, {}};

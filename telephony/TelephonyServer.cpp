@@ -3,8 +3,10 @@
 #include "host/AsioMainQueue.h"
 #include "host/SocketMessagePorts.h"
 #include "platform/Format.h"
+#include "platform/RepeatingTimer.h"
 #include "telephony/ServedChannel.h"
 
+#include <algorithm>
 #include <cerrno>
 
 namespace pallax {
@@ -12,6 +14,7 @@ namespace pallax {
 namespace {
 
 constexpr const char* kChannelSuffix = ".LogChannel.";
+constexpr std::chrono::seconds kLookInterval{1};
 
 } // namespace
 
@@ -31,6 +34,9 @@ Result<std::unique_ptr<TelephonyServer>, HostError> TelephonyServer::start(Setup
     }
     local.port->setDispatchQueue(kept.queue);
     server->_control = std::move(local.port);
+    TimerScheduler& timers = kept.timers != nullptr ? *kept.timers : kept.queue;
+    server->_looks =
+        timers.scheduleRepeating(kLookInterval, [self = server.get()] { self->closeIdle(); });
     return server;
 }
 
@@ -60,7 +66,7 @@ LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
     if (isOwnPort(localPortName)) {
         return {kServiceErrorDomain, EINVAL, {}};
     }
-    if (_channels.size() >= kMostChannels) {
+    if (!makeRoom()) {
         return {kServiceErrorDomain, EMFILE, {}};
     }
     auto source = _setup.makeSource();
@@ -85,7 +91,7 @@ LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
     if (error != 0) {
         return {kServiceErrorDomain, error, {}};
     }
-    _channels.emplace(number, std::move(channel));
+    _channels.emplace(number, Channel{std::move(channel), _setup.steadyNow()});
     return {0, 0, std::move(portName)};
 }
 
@@ -94,7 +100,7 @@ void TelephonyServer::removeChannel(int number) {
     if (found == _channels.end()) {
         return;
     }
-    const ServiceStatus::Client last = found->second->status();
+    const ServiceStatus::Client last = found->second.served->status();
     _sentBefore += last.sent;
     _droppedBefore += last.dropped;
     if (last.dropped > 0) {
@@ -104,10 +110,40 @@ void TelephonyServer::removeChannel(int number) {
     _channels.erase(found);
 }
 
+void TelephonyServer::closeIdle() {
+    const auto latest = _setup.steadyNow() - kMostIdle;
+    for (auto each = _channels.begin(); each != _channels.end();) {
+        const auto channel = each++;
+        if (!channel->second.served->hasStarted() && channel->second.opened <= latest) {
+            close(channel);
+        }
+    }
+}
+
+bool TelephonyServer::makeRoom() {
+    if (_channels.size() < kMostChannels) {
+        return true;
+    }
+    const auto idle = std::find_if(_channels.begin(), _channels.end(), [](const auto& entry) {
+        return !entry.second.served->hasStarted();
+    });
+    if (idle == _channels.end()) {
+        return false;
+    }
+    close(idle);
+    return true;
+}
+
+void TelephonyServer::close(Channels::iterator idle) {
+    report(formatText("%@ never started its log channel, which is closed now.",
+                      {idle->second.served->receiverPortName()}));
+    _channels.erase(idle);
+}
+
 std::size_t TelephonyServer::untaken() const {
     std::size_t bytes = 0;
     for (const auto& entry : _channels) {
-        bytes += entry.second->untaken();
+        bytes += entry.second.served->untaken();
     }
     return bytes;
 }
@@ -117,7 +153,7 @@ ServiceStatus TelephonyServer::status() const {
         std::chrono::duration_cast<std::chrono::seconds>(_setup.steadyNow() - _started);
     ServiceStatus status{_setup.technology, uptime.count(), _sentBefore, _droppedBefore, {}};
     for (const auto& entry : _channels) {
-        status.clients.push_back(entry.second->status());
+        status.clients.push_back(entry.second.served->status());
         status.sent += status.clients.back().sent;
         status.dropped += status.clients.back().dropped;
     }

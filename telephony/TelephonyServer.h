@@ -20,8 +20,10 @@ namespace pallax {
 
 class AsioMainQueue;
 class LocalMessagePort;
+class RepeatingTimer;
 class ServedChannel;
 class SocketMessagePorts;
+class TimerScheduler;
 
 /// The stand-in telephony service: a control port on which clients ask for log channels, and the
 /// channels, each with a source and a port of its own. Its destruction ends them all.
@@ -32,8 +34,12 @@ public:
     /// The bytes that wait for a slow client where packets come in their own time.
     static constexpr std::size_t kMostWaiting = std::size_t{1} << 20U;
 
-    /// At the same time; a client that asks for one more is refused.
+    /// At the same time. For a client that asks for one more, the oldest channel that was never
+    /// started is closed; where all were, the client is refused.
     static constexpr std::size_t kMostChannels = 64;
+
+    /// A channel that has not been started for so long is closed.
+    static constexpr std::chrono::seconds kMostIdle{10};
 
     struct Setup {
         AsioMainQueue& queue;
@@ -49,6 +55,7 @@ public:
         /// See SocketSink; nothing: no client loses anything, each at its own pace.
         std::optional<std::size_t> mostWaiting = std::nullopt;
         SteadyNow steadyNow = std::chrono::steady_clock::now;
+        TimerScheduler* timers = nullptr; ///< null: the queue's
     };
 
     /// Fails when the control port cannot be made, or a living service has that name.
@@ -57,26 +64,39 @@ public:
     TelephonyServer(const TelephonyServer&) = delete;
     TelephonyServer& operator=(const TelephonyServer&) = delete;
 
+    /// Gives up the control port, so that another service may have it; the channels stay.
+    void stopListening() { _control.reset(); }
     std::size_t channelCount() const { return _channels.size(); }
     /// Bytes that were sent, and that their clients have not read yet.
     std::size_t untaken() const;
     ServiceStatus status() const;
 
 private:
+    struct Channel {
+        std::unique_ptr<ServedChannel> served;
+        std::chrono::steady_clock::time_point opened;
+    };
+    using Channels = std::map<int, Channel>; // by number, so the oldest first
+
     explicit TelephonyServer(Setup setup);
     std::optional<ByteBuffer> answer(Bytes request);
     bool isOwnPort(const std::string& name) const;
     LogChannel createLogChannel(const std::string& localPortName);
     void removeChannel(int number);
+    void closeIdle();
+    /// False when there is no room for one more channel, and none can be made.
+    bool makeRoom();
+    void close(Channels::iterator idle);
     void report(const std::string& sentence) const;
 
     Setup _setup;
     std::unique_ptr<LocalMessagePort> _control;
-    std::map<int, std::unique_ptr<ServedChannel>> _channels; // by number
+    Channels _channels;
     int _latestNumber = 0;
     std::chrono::steady_clock::time_point _started;
     std::int64_t _sentBefore = 0;    // to clients that have gone
     std::int64_t _droppedBefore = 0; // likewise
+    std::unique_ptr<RepeatingTimer> _looks;
 };
 
 } // namespace pallax

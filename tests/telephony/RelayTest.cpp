@@ -21,6 +21,7 @@ public:
         if (!_bytes.empty()) {
             _data = {_bytes.front()};
             _bytes.pop_front();
+            ++_taken;
             return {State::Packet, Packet{Time(1s * _data[0]), _data}};
         }
         return {_ended ? State::End : State::Later, std::nullopt};
@@ -39,6 +40,8 @@ public:
         wake();
     }
 
+    int taken() const { return _taken; } ///< packets
+
 private:
     void wake() {
         if (auto ready = std::exchange(_ready, {})) {
@@ -50,6 +53,7 @@ private:
     doubles::SteppedQueue& _queue;
     std::deque<std::uint8_t> _bytes;
     ByteBuffer _data;
+    int _taken = 0;
     bool _ended = false;
     std::string _failure;
     std::function<void()> _ready;
@@ -57,14 +61,14 @@ private:
 
 class RelayTest : public testing::Test {
 protected:
-    RelayTest() {
+    explicit RelayTest(std::chrono::nanoseconds patience = 0s) {
         auto tap = std::make_unique<Tap>(_queue);
         _tap = tap.get();
-        _relay = std::make_unique<Relay>(
-            Relay::Setup{_queue, _queue, std::move(tap),
-                         [this](const std::string& sentence) { _reports.push_back(sentence); },
-                         [this](bool isOrderly) { _ends.push_back(isOrderly); },
-                         [this] { return std::chrono::steady_clock::time_point(_queue.now()); }});
+        _relay = std::make_unique<Relay>(Relay::Setup{
+            _queue, _queue, std::move(tap),
+            [this](const std::string& sentence) { _reports.push_back(sentence); },
+            [this](bool isOrderly) { _ends.push_back(isOrderly); },
+            [this] { return std::chrono::steady_clock::time_point(_queue.now()); }, patience});
         _queue.runReady();
     }
 
@@ -167,6 +171,54 @@ TEST_F(RelayTest, AStreamThatBreaksOffIsToldFromOneThatEnds) {
     EXPECT_EQ(_reports, (Reports{"standard input ends in the middle of a packet. 1 packets were "
                                  "relayed."}));
     EXPECT_EQ(_ends, (std::vector<bool>{false}));
+}
+
+/// A relay whose stream waits for its first source, for 20 seconds.
+class PatientRelayTest : public RelayTest {
+protected:
+    PatientRelayTest() : RelayTest(20s) {}
+};
+
+TEST_F(PatientRelayTest, TheStreamWaitsForTheFirstSourceToBegin) {
+    _tap->give({1, 2});
+    const auto first = _relay->source();
+    _queue.advance(15s);
+    EXPECT_EQ(_reports, Reports()) << "what waits has not stalled";
+    EXPECT_EQ(_tap->taken(), 0);
+    EXPECT_EQ(take(*first), std::vector<int>());
+    int told = 0;
+    first->whenReady([&] { ++told; });
+    _queue.runReady();
+    EXPECT_EQ(told, 1);
+    EXPECT_EQ(take(*first), (std::vector<int>{1, 2}));
+    const auto second = _relay->source();
+    EXPECT_EQ(take(*second), std::vector<int>()) << "it waits for the first alone";
+    _queue.advance(9s);
+    EXPECT_EQ(_reports, Reports());
+    _queue.advance(2s);
+    EXPECT_EQ(_reports, (Reports{"The stream has stalled: no packet for 10 s."}))
+        << "counted from the beginning";
+    _tap->give({3});
+    EXPECT_EQ(take(*first), (std::vector<int>{3}));
+    EXPECT_EQ(take(*second), (std::vector<int>{3}));
+}
+
+TEST_F(PatientRelayTest, WithoutASourceTheStreamIsTakenAllTheSameWhenTheTimeIsOver) {
+    _tap->give({1, 2});
+    _tap->end();
+    _queue.advance(20s - 1ns);
+    EXPECT_EQ(_reports, Reports());
+    EXPECT_EQ(_tap->taken(), 0);
+    _queue.advance(1ns);
+    EXPECT_EQ(_reports, (Reports{"The stream has ended. 2 packets were relayed."}));
+    EXPECT_EQ(_ends, (std::vector<bool>{true}));
+}
+
+TEST_F(PatientRelayTest, ASourceMayBeginWhenTheRelayHasGone) {
+    const auto source = _relay->source();
+    _relay.reset();
+    EXPECT_EQ(take(*source), (std::vector<int>{0}));
+    _queue.advance(30s);
 }
 
 TEST_F(RelayTest, ASourceMayOutliveTheRelay) {

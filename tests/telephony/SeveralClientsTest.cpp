@@ -165,9 +165,16 @@ TEST_F(SeveralClientsTest, WhereTheClientSetsThePaceNothingIsLost) {
     start(PlayOptions::kAsFastAsTaken, std::nullopt);
     const auto slow = open("slow", false);
     begin(*slow, {1, 2});
-    std::this_thread::sleep_for(300ms); // it could have lost much by now
+    ASSERT_TRUE(runUntil(_queue, [&] { return status().clients[0].sent > 0; }));
+    const auto quick = open("quick", true);
+    begin(*quick, {1, 2});
+    ASSERT_TRUE(runUntil(_queue, [&] { return quick->codes.size() == kPackets; }));
+    const ServiceStatus before = status();
+    EXPECT_GT(before.clients[0].sent, 0);
+    EXPECT_LT(before.clients[0].sent, kPackets) << "it is waited for";
     slow->local->setDispatchQueue(_queue);
     ASSERT_TRUE(runUntil(_queue, [&] { return slow->codes.size() == kPackets; }));
+    EXPECT_EQ(status().sent, 2 * kPackets);
     EXPECT_EQ(status().dropped, 0);
     _other.end();
     EXPECT_EQ(_reports, std::vector<std::string>());
@@ -176,6 +183,16 @@ TEST_F(SeveralClientsTest, WhereTheClientSetsThePaceNothingIsLost) {
 TEST_F(SeveralClientsTest, WithoutAServiceThereIsNoStatus) {
     EXPECT_EQ(askStatus(_ports, std::string(kTelephonyControlPort)).error().sentence,
               "No telephony service is running.");
+}
+
+TEST_F(SeveralClientsTest, AServiceThatTakesNoConnectionGivesNoStatus) {
+    const std::string name(kTelephonyControlPort);
+    const Descriptor listener = listenAt(*_ports.directory().socketPath(name)); // accepts nothing
+    std::vector<std::unique_ptr<RemoteMessagePort>> waiting;
+    do { // until no other connection can wait
+        waiting.push_back(_ports.createRemote(name));
+    } while (waiting.back() != nullptr);
+    EXPECT_EQ(askStatus(_ports, name).error().sentence, "The telephony service does not answer.");
 }
 
 } // namespace

@@ -2,6 +2,7 @@
 
 #include "tests/telephony/ServiceFolder.h"
 
+#include <algorithm>
 #include <atomic>
 #include <condition_variable>
 #include <mutex>
@@ -27,6 +28,8 @@ public:
         std::condition_variable changed;
         int available = 0;
         int taken = 0;
+        int wanted = 0;        ///< of those taken, so many the source was asked for
+        int furthestAhead = 0; ///< most packets that were taken and not yet wanted
         bool ended = false;
     };
 
@@ -43,6 +46,7 @@ public:
             return std::nullopt;
         }
         _data = {static_cast<std::uint8_t>(++_tap->taken)};
+        _tap->furthestAhead = std::max(_tap->furthestAhead, _tap->taken - _tap->wanted);
         return RecordedPacket{kRecordingStart, _data};
     }
     const std::optional<RecordingError>& error() const override { return _error; }
@@ -101,16 +105,24 @@ TEST_F(StreamSourceTest, GivesPacketsAsTheyComeAndTheFailureAtTheEnd) {
 
 TEST_F(StreamSourceTest, ReadsAheadOnlySoFar) {
     StreamSource source(_queue, std::make_unique<LiveRecording>(_tap));
-    _tap->give(10'000);
-    const auto taken = [&] {
-        const std::lock_guard lock(_tap->mutex);
-        return static_cast<std::size_t>(_tap->taken);
-    };
-    ASSERT_TRUE(runUntil(_queue, [&] { return taken() == StreamSource::kMostAhead; }));
-    std::this_thread::sleep_for(std::chrono::milliseconds(20));
-    EXPECT_EQ(taken(), StreamSource::kMostAhead);
-    EXPECT_EQ(source.next().state, PacketSource::State::Packet);
-    EXPECT_TRUE(runUntil(_queue, [&] { return taken() == StreamSource::kMostAhead + 1; }));
+    constexpr int kPackets = 2000;
+    constexpr int kMost = StreamSource::kMostAhead;
+    _tap->give(kPackets);
+    // The thread comes to its limit again for each packet that is taken, and never beyond it.
+    for (int wanted = 0; wanted < kPackets; ++wanted) {
+        ASSERT_TRUE(runUntil(_queue, [&] {
+            const std::lock_guard lock(_tap->mutex);
+            return _tap->taken >= std::min(wanted + kMost, kPackets);
+        })) << wanted;
+        {
+            const std::lock_guard lock(_tap->mutex);
+            _tap->wanted = wanted + 1;
+        }
+        ASSERT_EQ(source.next().state, PacketSource::State::Packet) << wanted;
+    }
+    const std::lock_guard lock(_tap->mutex);
+    EXPECT_EQ(_tap->taken, kPackets);
+    EXPECT_EQ(_tap->furthestAhead, kMost);
 }
 
 TEST_F(StreamSourceTest, MayBeDestroyedWhileItsThreadWaits) {

@@ -4,9 +4,11 @@
 #include "host/WallClock.h"
 #include "telephony/RecordingSource.h"
 #include "telephony/SocketTelephonyService.h"
+#include "tests/doubles/SteppedQueue.h"
 #include "tests/telephony/ServiceFolder.h"
 
 #include <cerrno>
+#include <future>
 
 namespace pallax {
 namespace {
@@ -167,17 +169,90 @@ TEST_F(TelephonyServerTest, AChannelToThatServiceItselfIsRefused) {
     }
 }
 
-TEST_F(TelephonyServerTest, OneChannelMoreThanTheMostIsRefused) {
+TEST_F(TelephonyServerTest, OneStartedChannelMoreThanTheMostIsRefused) {
     start(recordLte(_folder, 1));
-    ASSERT_EQ(openChannel().errorCode, 0);
+    const auto begin = [this](const LogChannel& channel) {
+        const auto remote = _ports.createRemote(channel.remotePortName.value_or(""));
+        ASSERT_NE(remote, nullptr);
+        // What follows is handled behind it, so that its reply says that it was.
+        ASSERT_EQ(send(*remote, startCommand(0), false).error, SendError::None);
+        ASSERT_TRUE(send(*remote, {{"GetTechnology", "GetTechnology"}}, true).reply);
+    };
+    begin(openChannel());
     SocketTelephonyService service(_ports);
     const auto connection = service.connect({});
     for (std::size_t count = 1; count < TelephonyServer::kMostChannels; ++count) {
-        ASSERT_EQ(connection->HXServerConnectionNetworkMonitorCreateLogChannel("viewer").errorCode,
-                  0);
+        begin(connection->HXServerConnectionNetworkMonitorCreateLogChannel("viewer"));
     }
     EXPECT_EQ(connection->HXServerConnectionNetworkMonitorCreateLogChannel("viewer").errorCode,
               EMFILE);
+    _other.end();
+    EXPECT_EQ(_reports, std::vector<std::string>());
+}
+
+TEST_F(TelephonyServerTest, ForOneChannelMoreThanTheMostTheOldestThatWasNotStartedIsClosed) {
+    start(recordLte(_folder, 1));
+    const auto oldest = _ports.createRemote(openChannel().remotePortName.value_or(""));
+    ASSERT_NE(oldest, nullptr);
+    ASSERT_EQ(send(*oldest, startCommand(1), false).error, SendError::None);
+    ASSERT_TRUE(send(*oldest, {{"GetTechnology", "GetTechnology"}}, true).reply);
+    SocketTelephonyService service(_ports);
+    const auto connection = service.connect({});
+    std::vector<std::unique_ptr<RemoteMessagePort>> idle;
+    for (std::size_t count = 0; count < TelephonyServer::kMostChannels; ++count) {
+        const auto channel = connection->HXServerConnectionNetworkMonitorCreateLogChannel("viewer");
+        ASSERT_EQ(channel.errorCode, 0) << count;
+        idle.push_back(_ports.createRemote(*channel.remotePortName));
+    }
+    EXPECT_TRUE(runUntil(_queue, [&] { return !idle.front()->isValid(); }));
+    EXPECT_TRUE(idle[1]->isValid());
+    EXPECT_TRUE(oldest->isValid());
+    _other.end();
+    EXPECT_EQ(_reports, (std::vector<std::string>{
+                            "viewer never started its log channel, which is closed now."}));
+}
+
+TEST_F(TelephonyServerTest, AChannelThatIsNotStartedIsClosedAfter10Seconds) {
+    doubles::SteppedQueue timers; // as the server, it runs on the other queue
+    auto server = TelephonyServer::start(
+        {_other.queue,
+         _serverPorts,
+         std::string(kTelephonyControlPort),
+         [recording = recordLte(_folder, 1)] { return RecordingSource::open(recording); },
+         {PlayOptions::kAsFastAsTaken, false, 2s},
+         [this](const std::string& sentence) { _reports.push_back(sentence); },
+         "Zorell_LTE",
+         std::nullopt,
+         [&timers] { return std::chrono::steady_clock::time_point(timers.now()); },
+         &timers});
+    ASSERT_TRUE(server);
+    _server = std::move(server).value();
+    const auto pass = [&](std::chrono::nanoseconds time) {
+        std::promise<void> passed;
+        _other.queue.async([&] {
+            timers.advance(time);
+            passed.set_value();
+        });
+        passed.get_future().get();
+    };
+    const auto idle = _ports.createRemote(openChannel().remotePortName.value_or(""));
+    SocketTelephonyService service(_ports);
+    const auto started =
+        _ports.createRemote(service.connect({})
+                                ->HXServerConnectionNetworkMonitorCreateLogChannel("viewer")
+                                .remotePortName.value_or(""));
+    ASSERT_EQ(send(*started, startCommand(1), false).error, SendError::None);
+    pass(9s);
+    EXPECT_TRUE(send(*idle, {{"GetTechnology", "GetTechnology"}}, true).reply)
+        << "to ask is not to start";
+    EXPECT_TRUE(send(*started, {{"GetTechnology", "GetTechnology"}}, true).reply);
+    pass(1s);
+    EXPECT_TRUE(runUntil(_queue, [&] { return !idle->isValid(); }));
+    pass(60s);
+    EXPECT_TRUE(send(*started, {{"GetTechnology", "GetTechnology"}}, true).reply);
+    _other.end();
+    EXPECT_EQ(_reports, (std::vector<std::string>{
+                            "viewer never started its log channel, which is closed now."}));
 }
 
 TEST_F(TelephonyServerTest, ARecordingThatHasGoneIsAnErrorAndReported) {
