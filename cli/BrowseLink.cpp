@@ -1,9 +1,11 @@
 #include "cli/BrowseLink.h"
 
 #include "LogGenerator/Technologies/Technologies.h"
+#include "platform/Format.h"
 #include "telephony/ChildService.h"
 
 #include <sys/wait.h>
+#include <unistd.h>
 #include <utility>
 
 namespace pallax {
@@ -13,15 +15,21 @@ BrowseLink::BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, C
     : _child(child), _notices(notices),
       _localPortName(child != nullptr ? child->privateName(localPortName)
                                       : std::string(localPortName)),
-      _clock(_wallClock, _queue), _socketPorts(_queue, std::move(directory), &_clock),
-      _ports(_socketPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
-      _telephony(_socketPorts,
-                 child != nullptr ? child->controlPortName() : std::string(kTelephonyControlPort)),
+      _clock(_wallClock, _queue),
+      _controlPortName(child != nullptr ? child->controlPortName()
+                                        : std::string(kTelephonyControlPort)),
+      _socketPorts(_queue, std::move(directory), &_clock),
+      _telephony(_socketPorts, _controlPortName),
+      _linkPorts({_socketPorts, _telephony,
+                  formatText("%@.Viewer.%d", {PallaxModel::kLocalPortName, ::getpid()}),
+                  [this] { return _socketPorts.lastError(); },
+                  [this] { return _socketPorts.isTaken(_controlPortName); }}),
+      _ports(_linkPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
       _resources(DirectoryResources::programFolder()) {}
 
 PallaxModel::Platform BrowseLink::modelPlatform(ModelObserver& observer) {
     return {
-        _ports,         _telephony, _queue,        _clock, {_clock, _resources, _bundle, _notices},
+        _ports,         _linkPorts, _queue,        _clock, {_clock, _resources, _bundle, _notices},
         technologies(), observer,   _localPortName};
 }
 

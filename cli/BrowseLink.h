@@ -1,6 +1,7 @@
 #pragma once
 
 #include "cli/FatalRecord.h"
+#include "cli/LinkPorts.h"
 #include "host/AsioMainQueue.h"
 #include "host/BuildBundle.h"
 #include "host/DirectoryResources.h"
@@ -26,7 +27,8 @@ public:
     static constexpr std::chrono::milliseconds kLookInterval{500};
 
     /// `child` is null for the machine's own service; a child's clients get names of their own,
-    /// made of `localPortName`. What is referred to outlives the link.
+    /// made of `localPortName`. Where that name is taken, the link has another for this process
+    /// (see LinkPorts). What is referred to outlives the link.
     BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
                StandardOutput& notices,
                std::string_view localPortName = PallaxModel::kLocalPortName);
@@ -34,6 +36,8 @@ public:
     AsioMainQueue& queue() { return _queue; }
     SourceClock& clock() { return _clock; }
     PallaxModel::Platform modelPlatform(ModelObserver& observer);
+    /// See LinkPorts.
+    const std::string& obstacle() const { return _linkPorts.obstacle(); }
 
     bool hasChild() const { return _child != nullptr; }
     /// True once the child has ended; it is left to its owner to reap.
@@ -46,9 +50,11 @@ private:
     AsioMainQueue _queue;
     WallClock _wallClock;
     SourceClock _clock;
+    std::string _controlPortName;
     SocketMessagePorts _socketPorts;
-    GuardedMessagePorts _ports;
     SocketTelephonyService _telephony;
+    LinkPorts _linkPorts;
+    GuardedMessagePorts _ports;
     DirectoryResources _resources;
     BuildBundle _bundle;
 };

@@ -1,6 +1,8 @@
 #include "cli/PrintBrowser.h"
 
 #include "cli/Output.h"
+#include "cli/Programs.h"
+#include "cli/WaitNotice.h"
 
 #include <chrono>
 #include <csignal>
@@ -31,6 +33,8 @@ bool PrintBrowser::run() {
         _printer.showConnection(_model.isConnected());
     });
     const auto looks = queue.scheduleRepeating(BrowseLink::kLookInterval, [this] { look(); });
+    const WaitNotice notice({queue, [this] { return _model.isConnected(); },
+                             [this] { return _link.obstacle(); }, complainOfWaiting});
     queue.run();
     return !_childLost;
 }

@@ -10,4 +10,10 @@ void complain(std::string_view sentence) {
     (void)std::fwrite(line.data(), 1, line.size(), stderr);
 }
 
+void complainOfWaiting(const std::string& text) {
+    if (!text.empty()) {
+        complain(text + ".");
+    }
+}
+
 } // namespace pallax

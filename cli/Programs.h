@@ -3,6 +3,7 @@
 #include "cli/ExitStatus.h"
 #include "cli/Options.h"
 
+#include <string>
 #include <string_view>
 
 /// What the parsed command line runs: the parts of the system, wired to this machine. Each
@@ -16,5 +17,7 @@ ExitStatus runSimulate(const SimulateOptions& options);
 
 /// "pallax: " and the sentence, on standard error.
 void complain(std::string_view sentence);
+/// The same for what WaitNotice says.
+void complainOfWaiting(const std::string& text);
 
 } // namespace pallax

@@ -37,8 +37,13 @@ ExitStatus record(const RecordOptions& options) {
     TerminalLine progress = TerminalLine::onStandardError();
     std::optional<std::string> failure;
     {
-        Recorder recorder(std::move(directory).value(), options.technology, **files,
-                          [&progress](const std::string& text) { progress.show(text); });
+        Recorder recorder(
+            std::move(directory).value(), options.technology, **files,
+            [&progress](const std::string& text) { progress.show(text); },
+            [&progress](const std::string& text) {
+                progress.wipe();
+                complainOfWaiting(text);
+            });
         failure = recorder.run();
     }
     progress.leave();

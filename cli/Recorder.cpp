@@ -1,5 +1,6 @@
 #include "cli/Recorder.h"
 
+#include "cli/WaitNotice.h"
 #include "host/Recording.h"
 #include "platform/Format.h"
 #include "platform/PropertyListCodec.h"
@@ -37,12 +38,12 @@ const RecordedTechnology* technologyIn(Bytes reply) {
 } // namespace
 
 Recorder::Recorder(SocketDirectory directory, const RecordedTechnology* wanted,
-                   RecordingFiles& files, Progress progress)
-    : _wanted(wanted), _files(files), _progress(std::move(progress)),
+                   RecordingFiles& files, Progress progress, Progress waits)
+    : _wanted(wanted), _files(files), _progress(std::move(progress)), _waits(std::move(waits)),
       _link(std::move(directory), OnFatalRecord::Skip, nullptr, _notices, localPortName()),
       _browsing(_link.modelPlatform(*this)), _ports(_browsing.ports, *this), _model(platform()) {}
 
-/// A viewer's, but for the ports.
+/// A viewer's, but for the ports and the delay: what is not recorded meanwhile is lost.
 PallaxModel::Platform Recorder::platform() {
     return {_ports,
             _browsing.telephony,
@@ -51,7 +52,8 @@ PallaxModel::Platform Recorder::platform() {
             _browsing.generators,
             _browsing.technologies,
             _browsing.observer,
-            _browsing.localPortName};
+            _browsing.localPortName,
+            kRetryDelay};
 }
 
 std::optional<std::string> Recorder::run() {
@@ -60,6 +62,8 @@ std::optional<std::string> Recorder::run() {
     _link.clock().onEnd([&queue] { queue.stop(); });
     queue.async([this] { _model.startMonitor(); });
     const auto looks = queue.scheduleRepeating(kProgressInterval, [this] { tellProgress(); });
+    const WaitNotice notice({queue, [this] { return _model.isConnected(); },
+                             [this] { return _link.obstacle(); }, _waits});
     queue.run();
     return _failure;
 }

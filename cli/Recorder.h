@@ -7,6 +7,7 @@
 #include "monitor/PallaxModel.h"
 #include "platform/StandardOutput.h"
 
+#include <chrono>
 #include <cstdint>
 #include <functional>
 #include <optional>
@@ -21,9 +22,12 @@ class Recorder final : private LinkListener, private ModelObserver {
 public:
     /// Gets, about once a second, how far it has come.
     using Progress = std::function<void(const std::string& text)>;
+    /// How often it tries to connect.
+    static constexpr std::chrono::milliseconds kRetryDelay{500};
 
+    /// `waits` hears what it waits for, as WaitNotice says it.
     Recorder(SocketDirectory directory, const RecordedTechnology* wanted, RecordingFiles& files,
-             Progress progress);
+             Progress progress, Progress waits);
 
     /// Records until a signal, the end of the source or of whoever reads a pipe, or a failure:
     /// nothing, or the failure's sentence.
@@ -51,6 +55,7 @@ private:
     const RecordedTechnology* _wanted;
     RecordingFiles& _files;
     Progress _progress;
+    Progress _waits;
     const RecordedTechnology* _technology = nullptr; // that the modem has answered
     bool _isNewLink = false;                         // no packet has come over it yet
     std::optional<Time> _first;                      // stamp of the first packet

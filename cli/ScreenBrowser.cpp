@@ -1,6 +1,7 @@
 #include "cli/ScreenBrowser.h"
 
 #include "cli/Settings.h"
+#include "cli/WaitNotice.h"
 
 #include <chrono>
 #include <csignal>
@@ -49,8 +50,10 @@ PallaxApp::Surroundings ScreenBrowser::applicationSurroundings(const Settings& s
                                          _link.queue(),
                                          _link.clock(),
                                          [this](ModelObserver& observer) {
-                                             return std::make_unique<PallaxModel>(
+                                             auto model = std::make_unique<PallaxModel>(
                                                  _link.modelPlatform(observer));
+                                             _model = model.get();
+                                             return model;
                                          }};
     if (settings.snapshotDirectory) {
         surroundings.snapshotDirectory = *settings.snapshotDirectory;
@@ -78,6 +81,9 @@ bool ScreenBrowser::run() {
     _app.applicationDidFinishLaunching();
     waitForKey();
     const auto looks = queue.scheduleRepeating(BrowseLink::kLookInterval, [this] { look(); });
+    const WaitNotice notice({queue, [this] { return _model != nullptr && _model->isConnected(); },
+                             [this] { return _link.obstacle(); },
+                             [this](const std::string& text) { _frontEnd.setNote(text); }});
     queue.run();
     return !_childLost;
 }

@@ -52,6 +52,7 @@ private:
     void look();
 
     bool _childLost = false;
+    const PallaxModel* _model = nullptr; // the application's
     bool _isDisplayPosted = false;
     terminal::CursesTerminal& _terminal;
     DroppedNotices _notices; // the screen is no place for them

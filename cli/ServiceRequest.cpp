@@ -15,7 +15,8 @@ constexpr const char* kServiceFooter = R"(Examples:
   pallax service --status
 
 Every client gets a channel of its own. A recording or simulation begins anew
-for each; what is relayed goes to all as it comes, and the service ends with it.
+for each; what is relayed goes to all as it comes, once the first has come or
+--wait is over, and the service ends with it.
 A client that is too slow loses packets and delays nobody; with --speed max it
 sets its own pace and loses nothing.
 
@@ -37,7 +38,7 @@ void addServiceSimulated(CLI::App& app, std::optional<SimulationOptions>& simula
     addServiceSimulation(app, simulation)->excludes("--play");
 }
 
-void addServiceRelay(CLI::App& app, std::string& relayed) {
+void addServiceRelay(CLI::App& app, std::string& relayed, ServiceOptions& options) {
     const auto take = [&relayed](const std::string& text) {
         if (text != "-") {
             throw CLI::ValidationError("--relay", "only -, standard input, can be relayed");
@@ -50,6 +51,19 @@ void addServiceRelay(CLI::App& app, std::string& relayed) {
         ->excludes("--play")
         ->excludes("--speed") // the stream has its own
         ->excludes("--simulate");
+    constexpr double kLongest = 1e6; // eleven days
+    const auto takePatience = [&options](const double& seconds) {
+        if (!(seconds >= 0 && seconds <= kLongest)) {
+            throw CLI::ValidationError("--wait", "it takes a number from 0 to 1000000");
+        }
+        options.relayPatience = std::chrono::duration_cast<std::chrono::nanoseconds>(
+            std::chrono::duration<double>(seconds));
+    };
+    app.add_option_function<double>(
+           "--wait", takePatience,
+           "How long what is relayed waits for its first client (default: 10)")
+        ->type_name("SECONDS")
+        ->needs("--relay");
 }
 
 void addServiceStatus(CLI::App& app, bool& status) {
@@ -65,7 +79,7 @@ void addServiceStatus(CLI::App& app, bool& status) {
 void addService(CLI::App& app, ServiceRequest& request) {
     addServicePlay(app, request.options);
     addServiceSimulated(app, request.options.simulation);
-    addServiceRelay(app, request.relayed);
+    addServiceRelay(app, request.relayed, request.options);
     addServiceStatus(app, request.status);
     app.footer(kServiceFooter);
 }

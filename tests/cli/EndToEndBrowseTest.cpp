@@ -16,7 +16,6 @@ using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-constexpr const char* kLocalPort = "com.norvane.BasebandStateReport.LogChannel";
 
 std::vector<std::string> headersOf(const std::string& text) {
     std::vector<std::string> headers;
@@ -170,28 +169,6 @@ TEST_F(EndToEndBrowse, AServiceCannotBeStartedTwice) {
     const Run second = run({"service", "--play", recording});
     EXPECT_EQ(second.status, 1);
     EXPECT_NE(second.err.find("already running"), std::string::npos) << second.err;
-    service.signal(SIGTERM);
-    EXPECT_EQ(service.wait(), 0);
-    EXPECT_TRUE(nothingLeft());
-}
-
-TEST_F(EndToEndBrowse, ASecondViewerOfTheLiveModemFindsThePortInUse) {
-    PallaxProcess service(world, {"service", "--play", minute(), "--loop"});
-    EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
-    PallaxProcess first(world, {"--log-level", "3"});
-    EXPECT_TRUE(first.says("<3>Starting the display update timer\n"));
-    const auto sockets = world.sockets();
-    EXPECT_NE(std::find(sockets.begin(), sockets.end(), kLocalPort), sockets.end());
-
-    PallaxProcess second(world, {"--log-level", "3"});
-    EXPECT_TRUE(second.says("<3>Local messsage port already exists\n"));
-    EXPECT_TRUE(second.says("<3>Could not create the ports necessary\n"));
-    EXPECT_TRUE(second.says("Connecting...\n"));
-    EXPECT_EQ(world.sockets(), sockets) << "the first one's port stays";
-    second.signal(SIGTERM);
-    EXPECT_EQ(second.wait(), 0);
-    first.signal(SIGTERM);
-    EXPECT_EQ(first.wait(), 0);
     service.signal(SIGTERM);
     EXPECT_EQ(service.wait(), 0);
     EXPECT_TRUE(nothingLeft());

@@ -201,7 +201,8 @@ protected:
     EndToEndRelayBegins() {
         EXPECT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
         both = Descriptor(::open(pipe.c_str(), O_RDWR | O_CLOEXEC));
-        service.emplace(world, std::vector<std::string>{"service", "--relay", "-"}, pipe);
+        service.emplace(world, std::vector<std::string>{"service", "--relay", "-", "--wait", "0"},
+                        pipe);
     }
 
     std::string pipe = world.path("device");

@@ -124,7 +124,7 @@ TEST_F(EndToEndStatus, OfRecord) {
 }
 
 TEST_F(EndToEndStatus, OfService) {
-    ends({{"service", "--relay", "-"},
+    ends({{"service", "--relay", "-", "--wait", "0"},
           0,
           "pallax: The stream has ended. 51 packets were relayed.\n",
           sample});

@@ -113,7 +113,18 @@ TEST(Options, ServiceRelaysStandardInput) {
     const auto options = parsed<ServiceOptions>({"service", "--relay", "-"});
     EXPECT_EQ(options.recording, "-");
     EXPECT_TRUE(options.relay);
+    EXPECT_EQ(options.relayPatience, std::chrono::seconds(10));
     EXPECT_FALSE(parsed<ServiceOptions>({"service", "--play", "-"}).relay);
+}
+
+TEST(Options, ServiceRelaysAfterSoLongAWait) {
+    using std::chrono::milliseconds;
+    const auto patience = [](const char* seconds) {
+        return parsed<ServiceOptions>({"service", "--relay", "-", "--wait", seconds}).relayPatience;
+    };
+    EXPECT_EQ(patience("0"), milliseconds(0));
+    EXPECT_EQ(patience("2.5"), milliseconds(2500));
+    EXPECT_EQ(patience("1000000"), std::chrono::seconds(1'000'000));
 }
 
 TEST(Options, ServiceTellsItsStatus) {
@@ -277,6 +288,13 @@ TEST(Options, WrongUsageOfTheServiceAndTheRecorderIsOneClearSentence) {
         wrongUsage({"service", "--relay", "a.pcap"}),
         "pallax: --relay: only -, standard input, can be relayed (pallax service --help tells "
         "more)\n");
+    for (const char* seconds : {"-1", "1000001", "nan"}) {
+        EXPECT_EQ(wrongUsage({"service", "--relay", "-", "--wait", seconds}),
+                  "pallax: --wait: it takes a number from 0 to 1000000 (pallax service --help "
+                  "tells more)\n");
+    }
+    EXPECT_EQ(wrongUsage({"service", "--play", "a.pcap", "--wait", "1"}),
+              "pallax: --wait requires --relay (pallax service --help tells more)\n");
     EXPECT_EQ(wrongUsage({"service", "--relay", "-", "--play", "a"}),
               "pallax: --play excludes --relay (pallax service --help tells more)\n");
     EXPECT_EQ(wrongUsage({"service", "--status", "--play", "a"}),
