@@ -54,7 +54,7 @@ constexpr const char* kRecordFooter = R"(Examples:
 
 With --rotate-size or --rotate-seconds the files are drive-0001.pcapng,
 drive-0002.pcapng, ... Recording ends with Ctrl-C, and with the source. A viewer
-may run at the same time.
+may run at the same time. Where no service runs, it says so and waits for one.
 
 Exit status:
   0   success: ended by Ctrl-C, by the source, or by the reader of the output

@@ -16,7 +16,6 @@ using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-
 std::vector<std::string> headersOf(const std::string& text) {
     std::vector<std::string> headers;
     std::istringstream stream(text);
