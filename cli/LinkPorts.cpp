@@ -15,7 +15,7 @@ constexpr const char* kNoService = "No telephony service is running";
 constexpr const char* kNoAnswer = "The telephony service does not answer";
 constexpr const char* kBusy = "The telephony service is busy with other clients";
 constexpr const char* kNothingToPlay = "The telephony service has nothing to play to this client";
-constexpr const char* kNoTechnology = "The modem does not tell its technology";
+constexpr const char* kNoTechnology = "The modem tells no known technology";
 
 /// Why a request for a log channel gave none.
 std::string refusal(const LogChannel& channel) {
@@ -50,7 +50,7 @@ public:
 
     LogChannel
     HXServerConnectionNetworkMonitorCreateLogChannel(std::string_view /*localPortName*/) override {
-        const LogChannel channel =
+        LogChannel channel =
             _connection->HXServerConnectionNetworkMonitorCreateLogChannel(_link._localName);
         if (channel.errorCode != 0) {
             _link._obstacle = refusal(channel);

@@ -119,7 +119,7 @@ TEST_F(LinkPortsTest, WhatAStartHasFailedAtIsRemembered) {
 
     reply = {SendError::ReplyTimedOut, std::nullopt};
     (void)failedStart();
-    EXPECT_EQ(_link.obstacle(), "The modem does not tell its technology");
+    EXPECT_EQ(_link.obstacle(), "The modem tells no known technology");
 }
 
 TEST_F(LinkPortsTest, WhyTheServiceGivesNoLogChannelIsToldInWords) {
