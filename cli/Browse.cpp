@@ -147,7 +147,7 @@ ExitStatus runBrowse(const BrowseOptions& options) {
                           !options.print && terminal::CursesTerminal::isPossible()};
     SyslogSink syslog("pallax");
     if (!options.logLevel) {
-        const ScopedLog log(syslog, kSyslogLevel);
+        const ScopedLog log(syslog, settings->systemLogLevel);
         return browseWithLog(request);
     }
     if (request.isOnScreen && ::isatty(STDERR_FILENO) != 0) {
@@ -156,8 +156,8 @@ ExitStatus runBrowse(const BrowseOptions& options) {
         return kExitWrongUsage;
     }
     StderrSink standardError;
-    TeeSink both(syslog, kSyslogLevel, standardError, *options.logLevel);
-    const ScopedLog log(both, std::max(kSyslogLevel, *options.logLevel));
+    TeeSink both(syslog, settings->systemLogLevel, standardError, *options.logLevel);
+    const ScopedLog log(both, std::max(settings->systemLogLevel, *options.logLevel));
     return browseWithLog(request);
 }
 

@@ -2,6 +2,7 @@
 #include "cli/Programs.h"
 #include "cli/Recorder.h"
 #include "cli/ScopedLog.h"
+#include "cli/Settings.h"
 #include "cli/TeeSink.h"
 #include "cli/TerminalLine.h"
 #include "host/LogSinks.h"
@@ -61,11 +62,16 @@ ExitStatus record(const RecordOptions& options) {
 } // namespace
 
 ExitStatus runRecord(const RecordOptions& options) {
+    const SettingsResult settings = loadSettings(settingsFiles());
+    if (!settings) {
+        complain(settings.error().sentence);
+        return kExitFailure;
+    }
     SyslogSink syslog("pallax");
     StderrSink standardError;
     const int wanted = options.logLevel.value_or(kNothing);
-    TeeSink both(syslog, kSyslogLevel, standardError, wanted);
-    const ScopedLog log(both, std::max(kSyslogLevel, wanted));
+    TeeSink both(syslog, settings->systemLogLevel, standardError, wanted);
+    const ScopedLog log(both, std::max(settings->systemLogLevel, wanted));
     return record(options);
 }
 

@@ -4,7 +4,8 @@
 
 namespace pallax {
 
-/// What the machine's log gets: failures. Every packet makes several lines of less urgency.
+/// What the machine's log gets unless the settings say otherwise: failures. Every packet makes
+/// several lines of less urgency.
 constexpr int kSyslogLevel = static_cast<int>(LogPriority::Error);
 
 /// The system log goes to `sink` while this lives. The sink outlives it.

@@ -1,12 +1,13 @@
 #include "cli/Settings.h"
 
+#include "host/Files.h"
 #include "platform/Format.h"
 
 #include <algorithm>
+#include <charconv>
 #include <cstdlib>
 #include <filesystem>
-#include <fstream>
-#include <iterator>
+#include <system_error>
 
 namespace pallax {
 
@@ -24,6 +25,14 @@ std::string_view trimmed(std::string_view text) {
     return text.substr(start, text.find_last_not_of(kBlanks) - start + 1);
 }
 
+std::optional<int> logLevelIn(std::string_view text) {
+    constexpr int kHighestLevel = 7;
+    int level = 0;
+    const auto result = std::from_chars(text.data(), text.data() + text.size(), level);
+    const bool isWhole = result.ec == std::errc() && result.ptr == text.data() + text.size();
+    return isWhole && level >= 0 && level <= kHighestLevel ? std::optional(level) : std::nullopt;
+}
+
 /// Takes one setting; the reason when it cannot.
 std::optional<std::string> take(Settings& settings, std::string_view key, std::string_view value) {
     if (key == "on-fatal-record") {
@@ -32,6 +41,13 @@ std::optional<std::string> take(Settings& settings, std::string_view key, std::s
         }
         settings.onFatalRecord = value == "skip" ? OnFatalRecord::Skip : OnFatalRecord::Stop;
         return std::nullopt;
+    }
+    if (key == "system-log-level") {
+        const auto level = logLevelIn(value);
+        settings.systemLogLevel = level.value_or(settings.systemLogLevel);
+        return level ? std::nullopt
+                     : std::optional(formatText(
+                           "system-log-level is a number from 0 to 7, not \"%@\"", {value}));
     }
     if (key != "snapshot-directory" && key != "save-button-marker") {
         return formatText("there is no setting \"%@\"", {key});
@@ -70,16 +86,14 @@ SettingsResult parseSettings(std::string_view text, std::string_view file) {
 
 SettingsResult loadSettings(const std::vector<std::string>& files) {
     for (const std::string& file : files) {
-        std::error_code ignored;
-        if (!std::filesystem::exists(file, ignored)) {
-            continue;
+        const auto content = readRegularFile(file, kLargestSettings);
+        if (content) {
+            return parseSettings(std::string(content->begin(), content->end()), file);
         }
-        std::ifstream stream(file, std::ios::binary);
-        if (!stream.is_open() || !std::filesystem::is_regular_file(file, ignored)) {
-            return SettingsError{file + " cannot be read."};
+        if (!content.error().isMissing) {
+            return SettingsError{
+                formatText("%@ cannot be read: %@.", {file, content.error().reason})};
         }
-        const std::string text{std::istreambuf_iterator<char>(stream), {}};
-        return parseSettings(text, file);
     }
     return Settings{};
 }

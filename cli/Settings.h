@@ -1,8 +1,10 @@
 #pragma once
 
 #include "cli/FatalRecord.h"
+#include "cli/ScopedLog.h"
 #include "platform/Result.h"
 
+#include <cstddef>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -16,6 +18,7 @@ struct Settings {
     OnFatalRecord onFatalRecord = OnFatalRecord::Stop; ///< on-fatal-record = stop | skip
     std::optional<std::string> snapshotDirectory;      ///< snapshot-directory = PATH
     std::optional<std::string> saveButtonMarker;       ///< save-button-marker = PATH
+    int systemLogLevel = kSyslogLevel;                 ///< system-log-level = 0 ... 7
 };
 
 /// One clear sentence that names file and line.
@@ -23,11 +26,14 @@ struct SettingsError {
     std::string sentence;
 };
 
+inline constexpr std::size_t kLargestSettings = std::size_t{1} << 20U;
+
 using SettingsResult = Result<Settings, SettingsError>;
 
 SettingsResult parseSettings(std::string_view text, std::string_view file);
 
-/// Reads the first of the files that exists; the defaults when there is none.
+/// Reads the first of the files that exists; the defaults when there is none. A file that cannot be
+/// looked at, is no regular file, or has more than kLargestSettings bytes is an error.
 SettingsResult loadSettings(const std::vector<std::string>& files);
 
 /// Where settings are looked for: in the user's configuration folder ($XDG_CONFIG_HOME, else

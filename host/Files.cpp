@@ -1,12 +1,14 @@
 #include "host/Files.h"
 
 #include "host/Descriptor.h"
+#include "platform/Format.h"
 
 #include <algorithm>
 #include <array>
 #include <cerrno>
 #include <cstdio>
 #include <cstdlib>
+#include <cstring>
 #include <fcntl.h>
 #include <sys/stat.h>
 
@@ -29,25 +31,37 @@ bool writeAll(const Descriptor& file, std::string_view content) {
 
 } // namespace
 
-std::optional<ByteBuffer> readFile(const std::string& path, std::size_t largest) {
-    const Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC));
+Result<ByteBuffer, ReadFailure> readRegularFile(const std::string& path, std::size_t largest) {
+    const Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY));
+    struct stat status {};
+    if (!file || ::fstat(file.number(), &status) != 0) {
+        return ReadFailure{errno == ENOENT || errno == ENOTDIR, std::strerror(errno)};
+    }
+    if (!S_ISREG(status.st_mode)) {
+        return ReadFailure{false,
+                           S_ISDIR(status.st_mode) ? "it is a folder" : "it is no regular file"};
+    }
     ByteBuffer content;
     constexpr std::size_t kPiece = std::size_t{64} << 10U;
     std::array<std::uint8_t, kPiece> piece; // NOLINT: filled by the call below
-    while (file) {
+    for (;;) {
         const ssize_t count = ::read(file.number(), piece.data(), piece.size());
         if (count == 0) {
             return content;
         }
         if (count < 0 && errno != EINTR) {
-            break;
+            return ReadFailure{false, std::strerror(errno)};
         }
         content.insert(content.end(), piece.begin(), piece.begin() + std::max<ssize_t>(count, 0));
         if (content.size() > largest) {
-            break;
+            return ReadFailure{false, formatText("it has more than %zu bytes", {largest})};
         }
     }
-    return std::nullopt;
+}
+
+std::optional<ByteBuffer> readFile(const std::string& path, std::size_t largest) {
+    auto content = readRegularFile(path, largest);
+    return content ? std::optional(std::move(content).value()) : std::nullopt;
 }
 
 bool writeFile(const std::string& path, std::string_view content) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/Bytes.h"
+#include "platform/Result.h"
 
 #include <optional>
 #include <string>
@@ -8,7 +9,16 @@
 
 namespace pallax {
 
-/// The content of a file of at most `largest` bytes; nothing when it cannot be read whole.
+/// Why a file could not be read.
+struct ReadFailure {
+    bool isMissing = false; ///< there is no such file, rather than one that cannot be looked at
+    std::string reason;     ///< "it is a folder", without a full stop
+};
+
+/// The content of a regular file of at most `largest` bytes. Anything else, such as a named pipe,
+/// is refused without waiting for it.
+Result<ByteBuffer, ReadFailure> readRegularFile(const std::string& path, std::size_t largest);
+/// The same where nobody asks why.
 std::optional<ByteBuffer> readFile(const std::string& path, std::size_t largest);
 
 /// Writes straight to the path; false when that failed.

@@ -50,7 +50,7 @@ protected:
     }
     /// Sends all of it, as long as the other side takes it.
     static void send(const Descriptor& socket, Bytes bytes) {
-        constexpr int kPatience = 5000;
+        constexpr int kMostMilliseconds = 5000;
         while (!bytes.empty()) {
             const Transfer sent = sendTo(socket, bytes);
             if (sent.state == Transfer::State::Closed) {
@@ -58,7 +58,7 @@ protected:
             }
             bytes = bytes.subspan(sent.count);
             pollfd entry{socket.number(), POLLOUT, 0};
-            if (!bytes.empty() && ::poll(&entry, 1, kPatience) <= 0) {
+            if (!bytes.empty() && ::poll(&entry, 1, kMostMilliseconds) <= 0) {
                 return;
             }
         }

@@ -305,8 +305,8 @@ TEST(Options, WrongUsageOfTheServiceAndTheRecorderIsOneClearSentence) {
         wrongUsage({"record", "--rotate-size", "0", "a"}),
         "pallax: --rotate-size: \"0\" is no size like 4096, 64k, 100M or 2G (pallax record --help "
         "tells more)\n");
-    for (const char* seconds : {"0", "-1", "nan", "1e10"}) {
-        EXPECT_EQ(wrongUsage({"record", "--rotate-seconds", seconds, "a"}),
+    for (const char* given : {"0", "-1", "nan", "1e10"}) {
+        EXPECT_EQ(wrongUsage({"record", "--rotate-seconds", given, "a"}),
                   "pallax: --rotate-seconds: it takes a number above 0 (pallax record --help tells "
                   "more)\n");
     }

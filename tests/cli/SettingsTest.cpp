@@ -7,6 +7,8 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <sys/stat.h>
+#include <unistd.h>
 
 namespace pallax {
 namespace {
@@ -21,12 +23,14 @@ TEST(Settings, AreReadLineByLine) {
                                         "\n"
                                         "  on-fatal-record =  skip \r\n"
                                         "snapshot-directory=/tmp/a = b\n"
+                                        "system-log-level = 4\n"
                                         "save-button-marker = /tmp/marker",
                                         "pallax.conf");
     ASSERT_TRUE(settings);
     EXPECT_EQ(settings->onFatalRecord, OnFatalRecord::Skip);
     EXPECT_EQ(settings->snapshotDirectory, "/tmp/a = b");
     EXPECT_EQ(settings->saveButtonMarker, "/tmp/marker");
+    EXPECT_EQ(settings->systemLogLevel, 4);
 }
 
 TEST(Settings, WithoutAFileTheDefaultsHold) {
@@ -35,6 +39,7 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
     EXPECT_EQ(settings->onFatalRecord, OnFatalRecord::Stop);
     EXPECT_EQ(settings->snapshotDirectory, std::nullopt);
     EXPECT_EQ(settings->saveButtonMarker, std::nullopt);
+    EXPECT_EQ(settings->systemLogLevel, 3);
 }
 
 TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
@@ -44,6 +49,12 @@ TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
               "pallax.conf, line 1: on-fatal-record is \"stop\" or \"skip\", not \"maybe\".");
     EXPECT_EQ(sentenceFor("snapshot-directory ="),
               "pallax.conf, line 1: snapshot-directory needs a path.");
+    for (const char* level : {"8", "-1", "4x", "", "warning", "99999999999"}) {
+        EXPECT_EQ(sentenceFor(std::string("\nsystem-log-level = ") + level),
+                  std::string("pallax.conf, line 2: system-log-level is a number from 0 to 7, "
+                              "not \"") +
+                      level + "\".");
+    }
     EXPECT_EQ(sentenceFor("skip"), "pallax.conf, line 1: a setting is written \"key = value\".");
 }
 
@@ -64,7 +75,53 @@ TEST_F(SettingsFileTest, TheFirstFileThatExistsHoldsAlone) {
 TEST_F(SettingsFileTest, AFolderInItsPlaceCannotBeRead) {
     const auto settings = loadSettings({folder.path()});
     ASSERT_FALSE(settings);
-    EXPECT_EQ(settings.error().sentence, folder.path() + " cannot be read.");
+    EXPECT_EQ(settings.error().sentence, folder.path() + " cannot be read: it is a folder.");
+}
+
+TEST_F(SettingsFileTest, ANamedPipeIsRefusedWithoutWaitingForIt) {
+    const std::string pipe = folder.path("pipe");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
+    const auto settings = loadSettings({pipe});
+    ASSERT_FALSE(settings);
+    EXPECT_EQ(settings.error().sentence, pipe + " cannot be read: it is no regular file.");
+}
+
+TEST_F(SettingsFileTest, AMebibyteIsTheMost) {
+    const std::string file = folder.write("large", std::string(1U << 20U, '\n'));
+    EXPECT_TRUE(loadSettings({file}));
+    (void)folder.write("large", std::string((1U << 20U) + 1, '\n'));
+    const auto settings = loadSettings({file});
+    ASSERT_FALSE(settings);
+    EXPECT_EQ(settings.error().sentence, file + " cannot be read: it has more than 1048576 bytes.");
+}
+
+TEST_F(SettingsFileTest, WhatCannotBeLookedAtIsNotMissing) {
+    const std::string circle = folder.path("circle");
+    std::filesystem::create_symlink(circle, circle);
+    const std::string file = folder.write("file", "");
+    const auto settings = loadSettings({circle + "/pallax.conf", file});
+    ASSERT_FALSE(settings);
+    EXPECT_EQ(settings.error().sentence, circle + "/pallax.conf cannot be read: Too many levels "
+                                                  "of symbolic links.");
+    EXPECT_TRUE(loadSettings({file + "/pallax.conf", folder.path("none/pallax.conf")}))
+        << "below a file there can be none";
+}
+
+TEST_F(SettingsFileTest, AFolderThatMayNotBeEnteredIsAnError) {
+    const std::string file = folder.write("pallax.conf", "on-fatal-record = skip\n");
+    std::filesystem::permissions(folder.path(), std::filesystem::perms::none);
+    const bool isRoot = ::geteuid() == 0;
+    constexpr uid_t kNobody = 65534;
+    if (isRoot) {
+        ASSERT_EQ(::seteuid(kNobody), 0);
+    }
+    const auto settings = loadSettings({file});
+    if (isRoot) {
+        ASSERT_EQ(::seteuid(0), 0);
+    }
+    std::filesystem::permissions(folder.path(), std::filesystem::perms::owner_all);
+    ASSERT_FALSE(settings);
+    EXPECT_EQ(settings.error().sentence, file + " cannot be read: Permission denied.");
 }
 
 TEST(SettingsFiles, AreTheUsersThenTheSystems) {

@@ -160,6 +160,31 @@ TEST_F(HostFilesTest, AFileAboveTheLimitIsNotRead) {
     EXPECT_EQ(readFile(_folder.path(), 4), std::nullopt);
 }
 
+TEST_F(HostFilesTest, OnlyARegularFileIsReadAndNoPipeIsWaitedFor) {
+    const std::string pipe = _folder.file("pipe");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
+    const auto failureFor = [](const std::string& path) {
+        const auto content = readRegularFile(path, 4);
+        const ReadFailure failure = content ? ReadFailure() : content.error();
+        return (failure.isMissing ? "missing: " : "") + failure.reason;
+    };
+    EXPECT_EQ(failureFor(pipe), "it is no regular file");
+    EXPECT_EQ(failureFor("/dev/zero"), "it is no regular file");
+    EXPECT_EQ(failureFor(_folder.path()), "it is a folder");
+    EXPECT_EQ(failureFor(_folder.write("f", "12345")), "it has more than 4 bytes");
+    EXPECT_EQ(failureFor(_folder.write("f", "1234")), "");
+    EXPECT_EQ(failureFor(_folder.file("absent")), "missing: No such file or directory");
+    EXPECT_EQ(failureFor(_folder.file("f/g")), "missing: Not a directory");
+}
+
+TEST_F(HostFilesTest, APipeInThePreferencesPlaceKeepsNobodyWaiting) {
+    ASSERT_EQ(::mkdir(_folder.file("p").c_str(), 0700), 0);
+    ASSERT_EQ(::mkfifo(_folder.file("p/d.plist").c_str(), S_IRUSR | S_IWUSR), 0);
+    FilePreferences preferences(_folder.file("p"));
+    preferences.setValue("key", "value", "d");
+    EXPECT_FALSE(preferences.synchronize("d"));
+}
+
 TEST(BuildBundle, HasAVersionAndTheMomentOfTheBuild) {
     const BuildBundle bundle;
     EXPECT_THAT(bundle.version(), testing::Optional(testing::MatchesRegex("[0-9]+.[0-9]+.[0-9]+")));

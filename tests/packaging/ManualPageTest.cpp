@@ -81,7 +81,8 @@ TEST(ManualPage, TheProgramWritesIt) {
 
 TEST(ManualPage, TheSettingsPageNamesEverySetting) {
     const std::string page = plain(contentOf(PALLAX_SOURCE_DIR "/docs/man/pallax.conf.5"));
-    for (const char* setting : {"on-fatal-record", "snapshot-directory", "save-button-marker"}) {
+    for (const char* setting :
+         {"on-fatal-record", "snapshot-directory", "save-button-marker", "system-log-level"}) {
         EXPECT_NE(page.find(std::string(".BR ") + setting), std::string::npos) << setting;
     }
 }
