@@ -9,7 +9,7 @@
 #include "cli/Settings.h"
 #include "cli/TeeSink.h"
 #include "host/LogSinks.h"
-#include "host/Recording.h"
+#include "host/RecordingFile.h"
 #include "telephony/ChildService.h"
 
 #include <algorithm>
@@ -87,9 +87,9 @@ ExitStatus browse(const Request& request, SocketDirectory directory, ChildServic
 }
 
 /// Why the recording cannot be browsed although it can be read; nothing when it can, or when only
-/// its reader will find out (standard input is read once).
+/// its reader will find out (a stream is read once).
 std::optional<std::string> refusalOf(const std::string& path) {
-    if (path == "-") {
+    if (RecordingFile::isStream(path)) {
         return std::nullopt;
     }
     const Recording::OpenResult recording = Recording::open(path);
@@ -97,6 +97,25 @@ std::optional<std::string> refusalOf(const std::string& path) {
         return std::nullopt; // the child service has the sentence, as for a foreign link type
     }
     return missingGenerator(**recording, technologies());
+}
+
+/// The service that serves what is asked for. A stream by name is opened here, whose standard error
+/// tells where it is waited for, and is the child's standard input.
+Result<std::unique_ptr<ChildService>, HostError> startChild(const BrowseOptions& options) {
+    ServiceOptions service;
+    service.recording = options.recording.value_or("");
+    service.play = options.play;
+    service.simulation = options.simulation;
+    if (service.recording.empty() || service.recording == "-" ||
+        !RecordingFile::isStream(service.recording)) {
+        return ChildService::start(std::move(service));
+    }
+    auto stream = RecordingFile::open(service.recording, complain);
+    if (!stream) {
+        return HostError{stream.error().sentence};
+    }
+    service.inputName = std::exchange(service.recording, "-");
+    return ChildService::start(std::move(service), std::move(stream).value().descriptor);
 }
 
 ExitStatus browseWithLog(const Request& request) {
@@ -111,11 +130,7 @@ ExitStatus browseWithLog(const Request& request) {
     }
     std::unique_ptr<ChildService> child;
     if (recording || request.options.simulation) {
-        ServiceOptions service;
-        service.recording = recording.value_or("");
-        service.play = request.options.play;
-        service.simulation = request.options.simulation;
-        auto started = ChildService::start(std::move(service));
+        auto started = startChild(request.options);
         if (!started) {
             complain(started.error().sentence);
             return kExitFailure;

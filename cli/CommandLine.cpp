@@ -5,6 +5,7 @@
 #include "cli/ManualPage.h"
 #include "cli/OptionParts.h"
 #include "cli/Suggestion.h"
+#include "host/RecordingFile.h"
 
 #include <CLI/CLI.hpp>
 
@@ -46,8 +47,13 @@ ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
     return wrongUsage(error.what(), commands.empty() ? "" : commands.front()->get_name());
 }
 
-bool loopsStandardInput(std::string_view recording, const PlayOptions& play) {
-    return play.loop && recording == "-";
+/// Why the recording cannot be begun again although that is asked for; empty otherwise.
+std::string loopRefusal(const std::string& recording, const PlayOptions& play) {
+    if (!play.loop || !RecordingFile::isStream(recording)) {
+        return {};
+    }
+    const std::string name = recording == "-" ? "standard input" : recording;
+    return name + " can be played only once, not with --loop";
 }
 
 /// The help and version flags that every command has.
@@ -146,12 +152,13 @@ ParsedOptions CommandLine::parse(std::vector<std::string> arguments) {
 }
 
 ParsedOptions CommandLine::chosen() const {
-    constexpr const char* kLoops = "standard input can be played only once, not with --loop";
-    if (loopsStandardInput(_browse.recording.value_or(""), _browse.play)) {
-        return wrongUsage(kLoops);
+    if (const auto refusal = loopRefusal(_browse.recording.value_or(""), _browse.play);
+        !refusal.empty()) {
+        return wrongUsage(refusal);
     }
-    if (loopsStandardInput(_service.options.recording, _service.options.play)) {
-        return wrongUsage(kLoops, "service");
+    if (const auto refusal = loopRefusal(_service.options.recording, _service.options.play);
+        !refusal.empty()) {
+        return wrongUsage(refusal, "service");
     }
     if (_record.files.path == "-" && _record.files.rotates()) {
         return wrongUsage("standard output is one recording, without --rotate-size and "

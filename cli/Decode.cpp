@@ -9,6 +9,7 @@
 #include "host/DirectoryResources.h"
 #include "host/LogSinks.h"
 #include "host/MonotonicClock.h"
+#include "host/RecordingFile.h"
 #include "platform/Format.h"
 
 #include <algorithm>
@@ -30,8 +31,11 @@ ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, c
         progress.wipe();
         complain(sentence);
     };
-    DecodeCommand command(options, {resources, bundle, notices, technologies()}, Recording::open,
-                          report, progress.isShown() ? &progress : nullptr);
+    const auto open = [&report](const std::string& path) {
+        return Recording::openInput({path, {}, report});
+    };
+    DecodeCommand command(options, {resources, bundle, notices, technologies()}, open, report,
+                          progress.isShown() ? &progress : nullptr);
     return use(command);
 }
 
@@ -134,11 +138,11 @@ ExitStatus decodeAtOnce(const DecodeOptions& options, DecodeProgress& progress, 
     return collector.status();
 }
 
-/// How many processes decode. Standard input may be live: what it gives must not wait for its end.
+/// How many processes decode. A stream may be live: what it gives must not wait for its end.
 unsigned jobsFor(const DecodeOptions& options) {
     const auto& recordings = options.recordings;
     if (recordings.size() < 2 ||
-        std::find(recordings.begin(), recordings.end(), "-") != recordings.end()) {
+        std::any_of(recordings.begin(), recordings.end(), RecordingFile::isStream)) {
         return 1;
     }
     return options.jobs.value_or(std::thread::hardware_concurrency());

@@ -38,8 +38,8 @@ constexpr const char* kDecodeFooter = R"(Examples:
   pallax decode --system-log drive.log drive.pcap
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
-standard input. On a terminal, what takes more than two seconds shows how far it
-has come.
+standard input; a recording may be a named pipe. On a terminal, what takes more
+than two seconds shows how far it has come.
 
 Exit status:
   0   success, also when nobody reads the output any more
@@ -110,8 +110,8 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
     CLI::Option* recording =
         app.add_option(
                "RECORDING", options.recording,
-               "A recording (pcap or pcapng; - is standard input) to browse as it is played; "
-               "without one, the live modem")
+               "A recording (pcap or pcapng, a file or a named pipe; - is standard input) to "
+               "browse as it is played; without one, the live modem")
             ->type_name("");
     addView(app, options);
     addPlay(app, options.play, recording);

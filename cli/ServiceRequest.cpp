@@ -15,8 +15,9 @@ constexpr const char* kServiceFooter = R"(Examples:
   pallax service --status
 
 Every client gets a channel of its own. A recording or simulation begins anew
-for each. What is relayed goes to all as it comes, and the service ends with it;
-the stream waits for its first client, as long as --wait says.
+for each, but a named pipe is played once, to the first. What is relayed goes to
+all as it comes, and the service ends with it; the stream waits for its first
+client, as long as --wait says.
 A client that is too slow loses packets and delays nobody; with --speed max it
 sets its own pace and loses nothing.
 

@@ -1,6 +1,7 @@
 // The reader of recordings, on libpcap.
 
 #include "host/Recording.h"
+#include "host/RecordingFile.h"
 #include "platform/Format.h"
 
 #include <pcap/pcap.h>
@@ -10,8 +11,10 @@
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
+#include <fcntl.h>
 #include <string_view>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace pallax {
 
@@ -25,13 +28,15 @@ RecordingError errorOf(Kind kind, const std::string& name, std::string_view what
 
 class PcapRecording final : public Recording {
 public:
-    PcapRecording(std::string name, pcap_t* capture)
-        : _name(std::move(name)), _capture(capture), _linkType(pcap_datalink(capture)) {}
+    PcapRecording(std::string name, pcap_t* capture, bool isStream)
+        : _name(std::move(name)), _capture(capture), _linkType(pcap_datalink(capture)),
+          _isStream(isStream) {}
     ~PcapRecording() override { pcap_close(_capture); }
     PcapRecording(const PcapRecording&) = delete;
     PcapRecording& operator=(const PcapRecording&) = delete;
 
     const std::string& name() const override { return _name; }
+    bool isStream() const override { return _isStream; }
     int linkType() const override { return _linkType; }
     const RecordedTechnology* technology() const override {
         return technologyOfLinkType(_linkType);
@@ -45,6 +50,7 @@ private:
     std::string _name;
     pcap_t* _capture;
     int _linkType;
+    bool _isStream;
     std::optional<RecordingError> _error;
     bool _ended = false;
 };
@@ -93,23 +99,40 @@ std::optional<std::uint64_t> PcapRecording::position() const {
     return position >= 0 ? std::optional(static_cast<std::uint64_t>(position)) : std::nullopt;
 }
 
+struct OpenedFile {
+    std::FILE* file;
+    bool isStream;
+};
+
 /// Opens the file for reading, or says why not.
-Result<std::FILE*, RecordingError> openFile(const std::string& path, const std::string& name) {
-    std::FILE* file = path == "-" ? stdin : std::fopen(path.c_str(), "rbe");
-    struct stat status {};
-    std::string_view reason;
-    if (file == nullptr || ::fstat(::fileno(file), &status) != 0) {
-        reason = std::strerror(errno);
-    } else if (S_ISDIR(status.st_mode)) {
-        reason = "it is a folder";
+Result<OpenedFile, RecordingError> openFile(const Recording::Input& input,
+                                            const std::string& name) {
+    const auto failed = [&name](std::string_view reason) {
+        return errorOf(Kind::CannotOpen, name, formatText("cannot be opened: %@", {reason}));
+    };
+    if (input.path == "-") {
+        struct stat status {};
+        if (::fstat(STDIN_FILENO, &status) != 0) {
+            return failed(std::strerror(errno));
+        }
+        return S_ISDIR(status.st_mode)
+                   ? Result<OpenedFile, RecordingError>(failed("it is a folder"))
+                   : OpenedFile{stdin, true};
     }
-    if (reason.empty()) {
-        return file;
+    const auto opened = RecordingFile::open(input.path, input.waiting);
+    if (!opened) {
+        return opened.error();
     }
-    if (file != nullptr && file != stdin) {
-        (void)std::fclose(file);
+    const int number = ::fcntl(opened->descriptor.number(), F_DUPFD_CLOEXEC, 0);
+    std::FILE* file = number >= 0 ? ::fdopen(number, "rb") : nullptr;
+    if (file == nullptr) {
+        const RecordingError error = failed(std::strerror(errno));
+        if (number >= 0) {
+            (void)::close(number);
+        }
+        return error;
     }
-    return errorOf(Kind::CannotOpen, name, formatText("cannot be opened: %@", {reason}));
+    return OpenedFile{file, opened->readOnce};
 }
 
 RecordingError noCapture(std::FILE* file, const std::string& name, std::string_view reason) {
@@ -125,13 +148,14 @@ RecordingError noCapture(std::FILE* file, const std::string& name, std::string_v
 
 } // namespace
 
-Recording::OpenResult Recording::open(const std::string& path) {
-    const std::string name = path == "-" ? "standard input" : path;
-    const auto opened = openFile(path, name);
+Recording::OpenResult Recording::openInput(const Input& input) {
+    const std::string path = input.path == "-" ? "standard input" : input.path;
+    const std::string& name = input.name.empty() ? path : input.name;
+    const auto opened = openFile(input, name);
     if (!opened) {
         return opened.error();
     }
-    std::FILE* file = *opened;
+    std::FILE* file = opened->file;
     const auto failed = [file](RecordingError error) {
         if (file != stdin) {
             (void)std::fclose(file);
@@ -152,7 +176,8 @@ Recording::OpenResult Recording::open(const std::string& path) {
     if (capture == nullptr) {
         return failed(noCapture(file, name, reason.data()));
     }
-    return std::unique_ptr<Recording>(std::make_unique<PcapRecording>(name, capture));
+    return std::unique_ptr<Recording>(
+        std::make_unique<PcapRecording>(name, capture, opened->isStream));
 }
 
 } // namespace pallax

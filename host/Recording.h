@@ -6,6 +6,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <span>
@@ -44,13 +45,24 @@ struct RecordingError {
 class Recording {
 public:
     using OpenResult = Result<std::unique_ptr<Recording>, RecordingError>;
+    /// Hears, as one sentence, that a stream gives nothing yet.
+    using Waiting = std::function<void(std::string_view sentence)>;
 
-    /// `path` "-" is standard input. A file of zero bytes is Empty, anything else that is no
-    /// capture is NoCapture. A capture without packets is no error.
-    static OpenResult open(const std::string& path);
+    struct Input {
+        std::string path;      ///< "-" is standard input
+        std::string name = {}; ///< for sentences; the path where it is empty
+        Waiting waiting = {};
+    };
+
+    /// A file of zero bytes is Empty, anything else that is no capture is NoCapture. A capture
+    /// without packets is no error.
+    static OpenResult openInput(const Input& input);
+    static OpenResult open(const std::string& path) { return openInput({path}); }
 
     virtual ~Recording() = default;
     virtual const std::string& name() const = 0; ///< as given; "standard input" for "-"
+    /// Whether it can be read only once: standard input, or a stream by name.
+    virtual bool isStream() const { return false; }
     virtual int linkType() const = 0;
     /// Null for a link type that is none of the five; whoever has been told the technology by
     /// other means (an option) need not care.

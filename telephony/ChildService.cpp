@@ -35,6 +35,7 @@ enum Argument {
     kLoop,
     kInterval,
     kRecording,
+    kInputName,
     kTechnology, // of a simulation, or empty; then the simulation's numbers
     kSeed,
     kRate,
@@ -90,6 +91,7 @@ std::vector<std::string> argumentsFor(const ServiceOptions& options) {
             std::string(options.play.loop ? kLooping : kOnce),
             std::to_string(options.play.displayInterval.count()),
             options.recording,
+            options.inputName,
             technology != nullptr ? std::string(technology->commandName) : std::string(),
             std::to_string(simulation.seed),
             std::to_string(simulation.packetsPerSecond),
@@ -129,15 +131,17 @@ void startAgain(char* const* arguments) {
 }
 
 /// In the child, between fork and exec: only what is safe there, and it does not return.
-[[noreturn]] void becomeService(pid_t parent, char* const* arguments, bool readsInput, int ready,
+/// `input` is what it reads as standard input; below zero, nothing.
+[[noreturn]] void becomeService(pid_t parent, char* const* arguments, int input, int ready,
                                 int complaints) {
     // Moved out of the way first, for either may be the number that the other is to have.
     const int readyCopy = ::fcntl(ready, F_DUPFD_CLOEXEC, kReadyDescriptor + 1);
     const int complaintsCopy = ::fcntl(complaints, F_DUPFD_CLOEXEC, kReadyDescriptor + 1);
     const int nothing = ::open("/dev/null", O_RDWR | O_CLOEXEC);
     const bool wired =
-        ::dup2(readyCopy, kReadyDescriptor) >= 0 && ::dup2(complaintsCopy, STDERR_FILENO) >= 0 &&
-        ::dup2(nothing, STDOUT_FILENO) >= 0 && (readsInput || ::dup2(nothing, STDIN_FILENO) >= 0);
+        (input == STDIN_FILENO || ::dup2(input >= 0 ? input : nothing, STDIN_FILENO) >= 0) &&
+        ::dup2(nothing, STDOUT_FILENO) >= 0 && ::dup2(complaintsCopy, STDERR_FILENO) >= 0 &&
+        ::dup2(readyCopy, kReadyDescriptor) >= 0;
     // Ctrl-C at the terminal goes to its whole group; when the child ends is the viewer's to say.
     (void)::setpgid(0, 0);
     if (wired && ::prctl(PR_SET_PDEATHSIG, SIGTERM) == 0 && ::getppid() == parent) {
@@ -184,7 +188,8 @@ std::string uniqueSuffix() {
 
 } // namespace
 
-Result<std::unique_ptr<ChildService>, HostError> ChildService::start(ServiceOptions options) {
+Result<std::unique_ptr<ChildService>, HostError> ChildService::start(ServiceOptions options,
+                                                                     Descriptor input) {
     const auto directory = SocketDirectory::open();
     if (!directory) {
         return directory.error();
@@ -201,16 +206,19 @@ Result<std::unique_ptr<ChildService>, HostError> ChildService::start(ServiceOpti
     pointers.push_back(nullptr);
     Pipe ready = makePipe();
     Pipe complaints = makePipe();
+    const bool readsOurs = !input && options.recording == "-";
+    const int childsInput = readsOurs ? STDIN_FILENO : input.number();
     const pid_t parent = ::getpid();
     const pid_t process = ready.read && complaints.read ? ::fork() : -1;
     if (process == 0) {
-        becomeService(parent, pointers.data(), options.recording == "-", ready.write.number(),
+        becomeService(parent, pointers.data(), childsInput, ready.write.number(),
                       complaints.write.number());
     }
     if (process < 0) {
         return HostError{
             formatText("The telephony service cannot be started: %@.", {std::strerror(errno)})};
     }
+    input.reset(); // or the stream's writer would not notice the child's end
     ready.write.reset();
     complaints.write.reset();
     std::unique_ptr<ChildService> service(
@@ -259,6 +267,7 @@ int runChildService(int argc, char** argv) {
     options.play.speed = parseSpeed(arguments[kSpeed]).value_or(1.0);
     options.play.loop = arguments[kLoop] == kLooping;
     options.recording = arguments[kRecording];
+    options.inputName = arguments[kInputName];
     options.lossless = true; // its only client is the viewer that has started it
     options.simulation = simulationOf(arguments);
     if (const auto interval = numberOf<std::int64_t>(arguments[kInterval]); interval > 0) {

@@ -21,9 +21,11 @@ inline constexpr std::string_view kChildServiceCommand = "--child-service";
 class ChildService {
 public:
     /// Starts it and waits until clients can connect; fails with the child's own sentence. The
-    /// control port's name in `options` does not matter. A recording "-" is read by the child,
-    /// from this process's standard input; this waits until the stream's header has come.
-    static Result<std::unique_ptr<ChildService>, HostError> start(ServiceOptions options);
+    /// control port's name in `options` does not matter. A recording "-" is read by the child, from
+    /// `input` or else this process's standard input; this waits until the stream's header has
+    /// come.
+    static Result<std::unique_ptr<ChildService>, HostError> start(ServiceOptions options,
+                                                                  Descriptor input = Descriptor());
     /// As `stop`.
     ~ChildService();
     ChildService(const ChildService&) = delete;

@@ -2,8 +2,8 @@
 
 namespace pallax {
 
-Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const std::string& path) {
-    auto recording = Recording::open(path);
+Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const Recording::Input& input) {
+    auto recording = Recording::openInput(input);
     if (!recording) {
         return HostError{recording.error().sentence};
     }
@@ -14,7 +14,7 @@ Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const std::stri
 }
 
 Result<std::unique_ptr<PacketSource>, HostError> RecordingSource::open(const std::string& path) {
-    auto recording = openKnownRecording(path);
+    auto recording = openKnownRecording({path});
     if (!recording) {
         return recording.error();
     }
@@ -39,7 +39,7 @@ void RecordingSource::whenReady(std::function<void()> ready) {
 }
 
 bool RecordingSource::restart() {
-    auto again = openKnownRecording(_path);
+    auto again = openKnownRecording({_path});
     if (!again) {
         return false;
     }

@@ -26,6 +26,6 @@ private:
 };
 
 /// Opens a recording and makes sure of its technology.
-Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const std::string& path);
+Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const Recording::Input& input);
 
 } // namespace pallax

@@ -2,6 +2,7 @@
 
 #include "host/AsioMainQueue.h"
 #include "host/SocketMessagePorts.h"
+#include "platform/Format.h"
 #include "platform/Printable.h"
 #include "telephony/RecordingSource.h"
 #include "telephony/Relay.h"
@@ -38,9 +39,10 @@ struct Program {
     std::shared_ptr<Relay> relay; ///< null for what is no live stream
 };
 
-Result<std::unique_ptr<PacketSource>, HostError> takeOnce(std::unique_ptr<PacketSource>& stream) {
+Result<std::unique_ptr<PacketSource>, HostError> takeOnce(std::unique_ptr<PacketSource>& stream,
+                                                          const std::string& name) {
     if (stream == nullptr) {
-        return HostError{"Standard input is already being played."};
+        return HostError{formatText("%@ is already being played.", {name})};
     }
     return std::move(stream);
 }
@@ -57,21 +59,26 @@ Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueu
                        },
                        nullptr};
     }
-    const auto open = [&options] { return openKnownRecording(options.recording); };
+    const auto open = [&options] {
+        return openKnownRecording({options.recording, options.inputName,
+                                   [](std::string_view told) { complain(std::string(told)); }});
+    };
     auto recording = options.relay ? openStream({open, complain}) : open();
     if (!recording) {
         return recording.error();
     }
     Program program;
     program.technology = (*recording)->technology()->identifier;
-    if (options.recording != "-") {
+    if (!(*recording)->isStream()) {
         program.makeSource = [path = options.recording] { return RecordingSource::open(path); };
         return program;
     }
     const auto stream = std::make_shared<std::unique_ptr<PacketSource>>(
         std::make_unique<StreamSource>(queue, std::move(recording).value()));
     if (!options.relay) {
-        program.makeSource = [stream] { return takeOnce(*stream); };
+        const bool isUnnamed = options.recording == "-" && options.inputName.empty();
+        const std::string name = isUnnamed ? "Standard input" : options.recording;
+        program.makeSource = [stream, name] { return takeOnce(*stream, name); };
         return program;
     }
     Relay::Setup relay{queue, queue, std::move(*stream), complain, std::move(relayEnded)};

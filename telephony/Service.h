@@ -16,7 +16,9 @@ namespace pallax {
 struct ServiceOptions {
     static constexpr std::chrono::seconds kRelayPatience{10};
 
-    std::string recording; ///< path, "-" for standard input (played once, to the first channel)
+    /// Path, "-" for standard input; a stream is played once, to the first channel.
+    std::string recording;
+    std::string inputName = {}; ///< what sentences call standard input; empty: that
     PlayOptions play;
     std::string controlPortName = std::string(kTelephonyControlPort);
     /// The recording is a live stream: it goes on to every client as it comes, and the service
