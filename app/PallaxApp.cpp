@@ -1,9 +1,9 @@
 #include "app/PallaxApp.h"
 
+#include "app/HomeScreenPreference.h"
 #include "platform/Clock.h"
 #include "platform/FileSystem.h"
 #include "platform/MainQueue.h"
-#include "platform/Preferences.h"
 #include "platform/ui/Toolkit.h"
 
 #include <utility>
@@ -17,9 +17,6 @@ constexpr const char* kNotConnected = "Connecting...";
 constexpr const char* kLaunching = "Connecting";
 constexpr const char* kUpdatePattern = "'Updated' yyyy-MM-dd 'at' HH:mm:ss";
 constexpr const char* kRootPath = "/";
-
-constexpr std::string_view kHomeScreenDomain = "com.norvane.plinthe";
-constexpr std::string_view kShowGSMRSSI = "PLShowGSMRSSI";
 
 /// The screens of the stack are panes, all of them made here or by another pane.
 PallaxPaneController& paneOf(ui::TableScreen& screen) {
@@ -88,10 +85,7 @@ void PallaxApp::getSaveButtonPref() {
 }
 
 void PallaxApp::_setGSMRSSI(bool shown) {
-    Preferences& preferences = _surroundings.preferences;
-    preferences.setValue(kShowGSMRSSI, PropertyList::boolean(shown), kHomeScreenDomain);
-    (void)preferences.synchronize(kHomeScreenDomain); // on failure there is nobody to tell
-    preferences.postChangedNotice(kHomeScreenDomain, kShowGSMRSSI);
+    setGSMRSSI(_surroundings.preferences, shown);
 }
 
 void PallaxApp::showSaveView() {

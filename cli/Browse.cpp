@@ -1,5 +1,6 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "cli/FatalRecord.h"
+#include "cli/KeptNotices.h"
 #include "cli/Output.h"
 #include "cli/Preconditions.h"
 #include "cli/PrintBrowser.h"
@@ -8,9 +9,11 @@
 #include "cli/ScreenBrowser.h"
 #include "cli/Settings.h"
 #include "cli/TeeSink.h"
+#include "host/Interruption.h"
 #include "host/LogSinks.h"
 #include "host/RecordingFile.h"
 #include "telephony/ChildService.h"
+#include "ui/terminal/TerminalRestorer.h"
 
 #include <algorithm>
 #include <memory>
@@ -55,12 +58,13 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
 
 /// As `browseInPrint`. The terminal is restored by the time anything else is told.
 bool browseOnScreen(const Request& request, SocketDirectory directory, ChildService* child) {
+    KeptNotices notices(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     auto terminal = terminal::CursesTerminal::open({request.options.color, request.options.mouse});
     if (!terminal) {
         throw std::runtime_error(terminal.error().sentence);
     }
     ScreenBrowser browser(std::move(directory), request.onFatalRecord, child, request.settings,
-                          **terminal);
+                          **terminal, notices);
     return browser.run();
 }
 
@@ -148,6 +152,8 @@ ExitStatus browseWithLog(const Request& request) {
 } // namespace
 
 ExitStatus runBrowse(const BrowseOptions& options) {
+    const Interruption interruption(
+        {terminal::TerminalRestorer::release, terminal::TerminalRestorer::restore});
     const SettingsResult settings = loadSettings(settingsFiles());
     if (!settings) {
         complain(settings.error().sentence);

@@ -1,5 +1,6 @@
 #include "cli/Output.h"
 
+#include "host/Interruption.h"
 #include "platform/Format.h"
 
 #include <cerrno>
@@ -15,7 +16,7 @@ void writeWhole(int descriptor, const std::string& name, std::string_view block)
         const ssize_t written = ::write(descriptor, block.data(), block.size());
         if (written >= 0) {
             block.remove_prefix(static_cast<std::size_t>(written));
-        } else if (errno == EPIPE) {
+        } else if (errno == EPIPE || (errno == EINTR && Interruption::isDue())) {
             throw OutputClosed();
         } else if (errno != EINTR) {
             const std::string reason = std::generic_category().message(errno);

@@ -8,7 +8,8 @@
 
 namespace pallax {
 
-/// Whoever reads our output has gone: a reason to end quietly, not a failure.
+/// Whoever reads our output has gone, or does not take it while a signal asks us to end: a reason
+/// to end quietly, not a failure.
 class OutputClosed : public std::runtime_error {
 public:
     OutputClosed() : std::runtime_error("the output was closed") {}
@@ -47,7 +48,8 @@ private:
 };
 
 /// Writes whole blocks to a file descriptor; throws OutputClosed when it is a pipe that nobody
-/// reads (SIGPIPE must be ignored), OutputFailure that names `name` otherwise.
+/// reads (SIGPIPE must be ignored) and when an Interruption is due, OutputFailure that names `name`
+/// otherwise.
 Output::Write writeToDescriptor(int descriptor, std::string name);
 
 } // namespace pallax

@@ -1,8 +1,10 @@
 #include "cli/PrintBrowser.h"
 
+#include "app/HomeScreenPreference.h"
 #include "cli/Output.h"
 #include "cli/Programs.h"
 #include "cli/WaitNotice.h"
+#include "host/FilePreferences.h"
 
 #include <chrono>
 #include <csignal>
@@ -21,9 +23,14 @@ PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecor
       _printer(output, _link.clock(), [this] { return _model.topLevelNodes(); }),
       _model(_link.modelPlatform(_printer)) {}
 
+PrintBrowser::~PrintBrowser() {
+    FilePreferences preferences(FilePreferences::userFolder());
+    setGSMRSSI(preferences, false);
+}
+
 bool PrintBrowser::run() {
     AsioMainQueue& queue = _link.queue();
-    queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [&queue](int /*signal*/) { queue.stop(); });
+    queue.onSignal({SIGINT, SIGTERM, SIGHUP, SIGQUIT}, [&queue](int /*signal*/) { queue.stop(); });
     if (_link.hasChild()) {
         // The last tick has posted its view update before; that is to come first.
         _link.clock().onEnd([&queue] { queue.async([&queue] { queue.stop(); }); });

@@ -14,6 +14,10 @@ class PrintBrowser {
 public:
     PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
                  Output& output);
+    /// Whatever ended it: switches the home-screen preference off, as the application does.
+    ~PrintBrowser();
+    PrintBrowser(const PrintBrowser&) = delete;
+    PrintBrowser& operator=(const PrintBrowser&) = delete;
 
     /// Browses until a signal, or with a child until its recording has ended. False when the
     /// child ended before.

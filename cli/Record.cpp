@@ -5,6 +5,7 @@
 #include "cli/Settings.h"
 #include "cli/TeeSink.h"
 #include "cli/TerminalLine.h"
+#include "host/Interruption.h"
 #include "host/LogSinks.h"
 #include "platform/Format.h"
 
@@ -62,6 +63,7 @@ ExitStatus record(const RecordOptions& options) {
 } // namespace
 
 ExitStatus runRecord(const RecordOptions& options) {
+    const Interruption interruption;
     const SettingsResult settings = loadSettings(settingsFiles());
     if (!settings) {
         complain(settings.error().sentence);

@@ -26,8 +26,8 @@ bool ScreenBrowser::Files::writePropertyList(const std::string& path, const Prop
 
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
                              ChildService* child, const Settings& settings,
-                             terminal::CursesTerminal& terminal)
-    : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, _notices),
+                             terminal::CursesTerminal& terminal, StandardOutput& notices)
+    : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, notices),
       _keys(_link.queue(), terminal.inputDescriptor()),
       _frontEnd({[this] { needsDisplay(); }, [this] { _link.queue().stop(); },
                  [this](const std::string& text) { _terminal.copy(text); },
@@ -67,7 +67,7 @@ PallaxApp::Surroundings ScreenBrowser::applicationSurroundings(const Settings& s
 bool ScreenBrowser::run() {
     AsioMainQueue& queue = _link.queue();
     // Behind SIGCONT the terminal may have another extent than before.
-    queue.onSignal({SIGINT, SIGTERM, SIGHUP, SIGWINCH, SIGCONT}, [this](int signal) {
+    queue.onSignal({SIGINT, SIGTERM, SIGHUP, SIGQUIT, SIGWINCH, SIGCONT}, [this](int signal) {
         if (signal == SIGWINCH || signal == SIGCONT) {
             adoptSize();
         } else {

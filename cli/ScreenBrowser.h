@@ -2,7 +2,6 @@
 
 #include "app/PallaxApp.h"
 #include "cli/BrowseLink.h"
-#include "cli/DroppedNotices.h"
 #include "host/FilePreferences.h"
 #include "host/HostFileSystem.h"
 #include "ui/terminal/CursesTerminal.h"
@@ -18,9 +17,11 @@ struct Settings;
 /// The application on the terminal that the process runs in.
 class ScreenBrowser {
 public:
-    /// The terminal outlives the browser, so that an error is told on a restored one.
+    /// The terminal outlives the browser, so that an error is told on a restored one. So do the
+    /// notices, which are to be printed there.
     ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                  const Settings& settings, terminal::CursesTerminal& terminal);
+                  const Settings& settings, terminal::CursesTerminal& terminal,
+                  StandardOutput& notices);
     /// Whatever ended it: the application terminates as it is to at every exit.
     ~ScreenBrowser();
     ScreenBrowser(const ScreenBrowser&) = delete;
@@ -55,7 +56,6 @@ private:
     const PallaxModel* _model = nullptr; // the application's
     bool _isDisplayPosted = false;
     terminal::CursesTerminal& _terminal;
-    DroppedNotices _notices; // the screen is no place for them
     BrowseLink _link;
     DescriptorWatch _keys;
     terminal::FrontEnd _frontEnd;

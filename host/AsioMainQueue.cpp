@@ -1,5 +1,7 @@
 #include "host/AsioMainQueue.h"
 
+#include "host/Interruption.h"
+
 #include <asio/executor_work_guard.hpp>
 #include <asio/io_context.hpp>
 #include <asio/posix/stream_descriptor.hpp>
@@ -129,6 +131,7 @@ void AsioMainQueue::onSignal(std::initializer_list<int> signals, std::function<v
     _impl->signals.emplace(_impl->context);
     for (const int number : signals) {
         _impl->signals->add(number);
+        Interruption::watch(number);
     }
     _impl->signalAction = std::move(action);
     _impl->waitForSignal();

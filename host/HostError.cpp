@@ -12,4 +12,11 @@ HostError unwritableRecording(std::string_view name, int error) {
             error == EPIPE};
 }
 
+HostError untakenRecording(std::string_view name, bool isWhole) {
+    return {formatText("The recording %@ ends in the middle of a packet, for its reader takes no "
+                       "more.",
+                       {name}),
+            isWhole};
+}
+
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "host/PcapNgWriter.h"
 
+#include "host/Interruption.h"
 #include "platform/Format.h"
 
 #include <algorithm>
@@ -166,6 +167,9 @@ std::optional<HostError> PcapNgWriter::put(const ByteBuffer& block) {
     while (written < block.size()) {
         const ssize_t count = ::write(_number, block.data() + written, block.size() - written);
         if (count < 0 && errno == EINTR) {
+            if (Interruption::isDue()) {
+                return untakenRecording(_name, written == 0);
+            }
             continue;
         }
         if (count <= 0) {

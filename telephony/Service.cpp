@@ -1,6 +1,7 @@
 #include "telephony/Service.h"
 
 #include "host/AsioMainQueue.h"
+#include "host/Interruption.h"
 #include "host/SocketMessagePorts.h"
 #include "platform/Format.h"
 #include "platform/Printable.h"
@@ -143,6 +144,7 @@ private:
 int serve(const ServiceOptions& options, const std::function<void()>& ready,
           SocketDirectory directory) {
     directory.removeStaleSockets();
+    const Interruption interruption; // of complaints that nobody reads
     AsioMainQueue queue;
     SocketMessagePorts ports(queue, std::move(directory));
     LastWords lastWords(queue);

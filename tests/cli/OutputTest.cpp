@@ -1,7 +1,11 @@
 #include "cli/Output.h"
 
+#include "host/AsioMainQueue.h"
+#include "host/Interruption.h"
+
 #include <gtest/gtest.h>
 
+#include <chrono>
 #include <csignal>
 #include <fcntl.h>
 #include <unistd.h>
@@ -49,6 +53,22 @@ TEST(Output, APipeThatNobodyReadsIsClosed) {
     ::close(pipe[0]);
     output.text() = "second";
     EXPECT_THROW(output.flush(), OutputClosed);
+    ::close(pipe[1]);
+}
+
+TEST(Output, WhatNobodyTakesIsGivenUpOnceASignalAsksForTheEnd) {
+    using std::chrono::milliseconds;
+    const Interruption interruption({nullptr, nullptr}, {milliseconds(20), milliseconds(1000)});
+    AsioMainQueue queue;
+    queue.onSignal({SIGTERM}, [&queue](int /*signal*/) { queue.stop(); });
+    int pipe[2] = {};
+    ASSERT_EQ(::pipe(pipe), 0);
+    Output output(writeToDescriptor(pipe[1], "Standard output"));
+    output.text() = std::string(1U << 20U, 'x'); // more than the pipe holds
+    (void)std::raise(SIGTERM);
+    EXPECT_THROW(output.flush(), OutputClosed);
+    queue.run(); // it has heard of the signal
+    ::close(pipe[0]);
     ::close(pipe[1]);
 }
 

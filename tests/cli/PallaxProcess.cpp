@@ -7,8 +7,10 @@
 #include <csignal>
 #include <cstdlib>
 #include <fcntl.h>
+#include <fstream>
 #include <spawn.h>
 #include <sys/prctl.h>
+#include <sys/syscall.h>
 #include <sys/wait.h>
 #include <thread>
 #include <unistd.h>
@@ -82,6 +84,25 @@ std::vector<std::string> programEnvironment(const World& world) {
 
 bool eventually(const std::function<bool()>& condition) {
     return within(seconds(30), condition);
+}
+
+bool waitsForItsReader(pid_t process, int output) {
+    return eventually([=] { return waitsForItsReaderNow(process, output); });
+}
+
+bool waitsForItsReaderNow(pid_t process, int output) {
+    std::ifstream call("/proc/" + std::to_string(process) + "/syscall");
+    std::string text;
+    std::getline(call, text); // the number of the call that it waits in, and the arguments
+    return text.starts_with(std::to_string(SYS_write) + " 0x" + std::to_string(output) + " ");
+}
+
+bool hasEnded(pid_t process) {
+    return eventually([process] {
+        siginfo_t info{};
+        const auto id = static_cast<id_t>(process);
+        return ::waitid(P_PID, id, &info, WEXITED | WNOHANG | WNOWAIT) == 0 && info.si_pid != 0;
+    });
 }
 
 bool noChildLeft() {

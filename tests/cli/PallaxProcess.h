@@ -42,6 +42,14 @@ std::vector<char*> pointersTo(std::vector<std::string>& texts);
 /// True once `condition` holds; false when it does not within ten seconds.
 bool eventually(const std::function<bool()>& condition);
 
+/// True once the process waits in a write to its standard output (or error, 2): nobody takes what
+/// it says.
+bool waitsForItsReader(pid_t process, int output = 1);
+/// Whether it does so now.
+bool waitsForItsReaderNow(pid_t process, int output = 1);
+/// True once it has ended; it is left to be waited for.
+bool hasEnded(pid_t process);
+
 /// True when no child process is left, waiting a little for those that are about to end.
 bool noChildLeft();
 

@@ -31,6 +31,8 @@ public:
     void type(const std::string& keys) const;
     void resize(int columns, int rows);
     void signal(int number) const;
+    /// While it runs.
+    pid_t id() const { return _process; }
 
     /// True once the screen shows the text; false, with a test failure that shows the screen,
     /// when it does not within ten seconds.

@@ -1,5 +1,7 @@
 #include "host/PcapNgWriter.h"
 
+#include "host/AsioMainQueue.h"
+#include "host/Interruption.h"
 #include "host/Recording.h"
 #include "tests/doubles/RuntimeFolder.h"
 
@@ -7,9 +9,14 @@
 #include <rapidcheck.h>
 
 #include <algorithm>
+#include <array>
+#include <chrono>
 #include <csignal>
+#include <cstdio>
+#include <fcntl.h>
 #include <filesystem>
 #include <sys/resource.h>
+#include <unistd.h>
 
 namespace pallax {
 namespace {
@@ -190,6 +197,55 @@ TEST_F(PcapNgWriterTest, WhereAPacketDoesNotFitTheFileEndsWithTheOneBefore) {
     EXPECT_EQ(error->sentence, "The recording " + path + " cannot be written: File too large.");
     EXPECT_EQ(doubles::contentOf(path).size(), size);
     EXPECT_EQ(packetsIn(), 1);
+}
+
+/// Standard output is a pipe that nobody reads, and SIGTERM has come.
+class PcapNgWriterToAStalledPipe : public testing::Test {
+protected:
+    PcapNgWriterToAStalledPipe() {
+        std::array<int, 2> ends{};
+        EXPECT_EQ(::pipe2(ends.data(), O_CLOEXEC), 0);
+        reader = Descriptor(ends[0]);
+        const Descriptor end(ends[1]);
+        (void)std::fflush(stdout);
+        (void)::dup2(end.number(), STDOUT_FILENO);
+        (void)::fcntl(STDOUT_FILENO, F_SETPIPE_SZ, 4096);
+        queue.onSignal({SIGTERM}, [](int /*signal*/) {});
+        auto made = PcapNgWriter::create("-", Existing::Keep);
+        EXPECT_TRUE(made);
+        writer = std::move(made).value();
+        (void)std::raise(SIGTERM);
+    }
+    ~PcapNgWriterToAStalledPipe() override { (void)::dup2(output.number(), STDOUT_FILENO); }
+
+    /// Writes packets of that size until one is not taken.
+    HostError errorOfPackets(std::size_t size) const {
+        const auto interface = writer->interfaceFor(kZorellLte, "Zorell_LTE");
+        for (int count = 0; interface && count < 1000; ++count) {
+            if (auto error = writer->write(*interface, kStamp, ByteBuffer(size))) {
+                return std::move(*error);
+            }
+        }
+        return {"none", false};
+    }
+
+    Interruption interruption{{nullptr, nullptr},
+                              {std::chrono::milliseconds(20), std::chrono::milliseconds(1000)}};
+    AsioMainQueue queue;
+    Descriptor output{::fcntl(STDOUT_FILENO, F_DUPFD_CLOEXEC, 0)};
+    Descriptor reader;
+    std::unique_ptr<PcapNgWriter> writer;
+};
+
+TEST_F(PcapNgWriterToAStalledPipe, EndsQuietlyBehindAWholePacket) {
+    EXPECT_TRUE(errorOfPackets(100).readerHasGone);
+}
+
+TEST_F(PcapNgWriterToAStalledPipe, TellsOfAPacketThatWasTakenInPart) {
+    const HostError error = errorOfPackets(10'000);
+    EXPECT_FALSE(error.readerHasGone);
+    EXPECT_EQ(error.sentence, "The recording standard output ends in the middle of a packet, for "
+                              "its reader takes no more.");
 }
 
 } // namespace

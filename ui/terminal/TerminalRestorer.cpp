@@ -32,12 +32,35 @@ Restoration restoration;
 extern "C" {
 /// Calls only what is safe in a signal handler. The signal's own action is back by then.
 static void restoreAndDie(int signal) {
+    TerminalRestorer::restore();
+    (void)std::raise(signal);
+}
+}
+
+namespace {
+
+/// As Ctrl-Q. What undoes a stop of the program's own does not undo the user's, unless that comes
+/// on top.
+void goOn(int descriptor) {
+    (void)::tcflow(descriptor, TCOOFF);
+    (void)::tcflow(descriptor, TCOON);
+}
+
+} // namespace
+
+void TerminalRestorer::release() {
+    if (restoration.hasModes) {
+        (void)::tcflush(restoration.descriptor, TCOFLUSH);
+        goOn(restoration.descriptor);
+    }
+}
+
+void TerminalRestorer::restore() {
+    goOn(restoration.descriptor); // or a process that is to die would wait
     (void)!::write(restoration.descriptor, restoration.sequence.data(), restoration.size);
     if (restoration.hasModes) {
         (void)::tcsetattr(restoration.descriptor, TCSANOW, &restoration.modes);
     }
-    (void)std::raise(signal);
-}
 }
 
 TerminalRestorer::TerminalRestorer(int descriptor) {
@@ -63,6 +86,8 @@ TerminalRestorer::~TerminalRestorer() {
     stack_t none{};
     none.ss_flags = SS_DISABLE;
     (void)::sigaltstack(&none, nullptr);
+    restoration.hasModes = false;
+    restoration.size = 0;
 }
 
 void TerminalRestorer::setSequence(std::string_view sequence) {

@@ -16,6 +16,12 @@ public:
 
     /// What is written to the terminal; nothing at first.
     void setSequence(std::string_view sequence);
+
+    /// Both are safe in a signal handler, and do nothing while there is no restorer. Lets output go
+    /// on that Ctrl-S, or a terminal that takes nothing, holds back; what waits there is dropped.
+    static void release();
+    /// Restores the terminal, also one that Ctrl-S has stopped.
+    static void restore();
 };
 
 } // namespace pallax::terminal

@@ -43,6 +43,9 @@ protected:
         (void)::tcsetattr(descriptor, TCSANOW, &modes);
     }
 
+    /// As the user's Ctrl-S.
+    void stop() const { EXPECT_EQ(::write(master, "\x13", 1), 1); }
+
     /// Runs a process that does `action`, and returns the signal that it died of; 0 if it did not.
     int signalAfter(const std::function<void()>& action) const {
         const pid_t child = ::fork();
@@ -146,6 +149,33 @@ TEST_F(TerminalRestorerTest, WhatIsNoTerminalIsOnlyWrittenTo) {
     EXPECT_EQ(std::string(bytes.data()), "restored");
     (void)::close(ends[0]);
     (void)::close(ends[1]);
+}
+
+TEST_F(TerminalRestorerTest, RestoresATerminalThatIsStopped) {
+    EXPECT_EQ(signalAfter([this] {
+                  constexpr unsigned kTooLong = 20; // seconds
+                  (void)::alarm(kTooLong);
+                  TerminalRestorer restorer(terminal);
+                  restorer.setSequence("restored");
+                  stop();
+                  (void)std::raise(SIGABRT);
+              }),
+              SIGABRT);
+    EXPECT_EQ(written(), "restored");
+}
+
+TEST_F(TerminalRestorerTest, ReleasesOutputThatIsHeldBack) {
+    TerminalRestorer::release(); // without a restorer, nothing
+    TerminalRestorer restorer(terminal);
+    (void)::fcntl(terminal, F_SETFL, O_NONBLOCK);
+    stop();
+    ASSERT_LT(::write(terminal, "x", 1), 0);
+    TerminalRestorer::release();
+    EXPECT_EQ(::write(terminal, "x", 1), 1) << "it was stopped";
+    while (::write(terminal, "yyyyyyyy", 8) > 0) {
+    }
+    TerminalRestorer::release();
+    EXPECT_EQ(::write(terminal, "x", 1), 1) << "it was full";
 }
 
 TEST_F(TerminalRestorerTest, LeavesAProcessThatDoesNotDieAlone) {

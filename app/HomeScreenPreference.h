@@ -1,0 +1,11 @@
+#pragma once
+
+namespace pallax {
+
+class Preferences;
+
+/// Stores whether the home screen shows the GSM signal strength, and tells it to read again. To be
+/// called with false at every exit.
+void setGSMRSSI(Preferences& preferences, bool shown);
+
+} // namespace pallax

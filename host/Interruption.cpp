@@ -1,0 +1,135 @@
+#include "host/Interruption.h"
+
+#include <algorithm>
+#include <array>
+#include <cerrno>
+#include <csignal>
+#include <cstddef>
+#include <ctime>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+using Handler = void (*)(int);
+
+constexpr std::array kEnding{SIGINT, SIGTERM, SIGHUP, SIGQUIT};
+/// How often blocked calls are interrupted: a few in a row, lines to a stalled standard error, are
+/// still over soon.
+constexpr std::chrono::milliseconds kInterval{10};
+
+/// A signal handler can reach nothing but what is global.
+struct State {
+    volatile std::sig_atomic_t signal = 0;
+    volatile std::sig_atomic_t ticks = 0;
+    bool isActive = false;
+    timer_t timer{};
+    timespec untilDue{};
+    timespec interval{};
+    std::sig_atomic_t mostTicks = 0;                // of a program that SIGQUIT is to end
+    std::array<Handler, kEnding.size()> handlers{}; // that the signals had before, or null
+    Interruption::Terminal terminal{};
+    struct sigaction alarmBefore {};
+};
+State state;
+
+timespec timeOf(std::chrono::milliseconds time) {
+    const auto seconds = std::chrono::floor<std::chrono::seconds>(time);
+    return {seconds.count(), std::chrono::nanoseconds(time - seconds).count()};
+}
+
+/// The signal's place among the ending ones, or their number.
+std::size_t placeOf(int signal) {
+    const auto* found = std::find(kEnding.begin(), kEnding.end(), signal);
+    return static_cast<std::size_t>(found - kEnding.begin());
+}
+
+} // namespace
+
+extern "C" {
+/// These call only what is safe in a signal handler.
+static void endIsAsked(int signal) {
+    const int error = errno;
+    if (state.signal == 0) {
+        state.signal = signal;
+        const itimerspec ticks{state.interval, state.untilDue};
+        (void)::timer_settime(state.timer, 0, &ticks, nullptr);
+    }
+    if (const Handler handler = state.handlers[placeOf(signal)]) { // NOLINT: the place is known
+        handler(signal);
+    }
+    errno = error;
+}
+
+static void interrupt(int /*signal*/) {
+    const int error = errno;
+    state.ticks = state.ticks + 1;
+    if (state.terminal.release != nullptr) {
+        state.terminal.release();
+    }
+    if (state.signal == SIGQUIT && state.ticks > state.mostTicks) {
+        if (state.terminal.restore != nullptr) {
+            state.terminal.restore();
+        }
+        (void)std::signal(SIGQUIT, SIG_DFL);
+        (void)std::raise(SIGQUIT); // takes effect behind this handler
+    }
+    errno = error;
+}
+}
+
+Interruption::Interruption(Terminal terminal, Patience patience) {
+    state.signal = 0;
+    state.ticks = 0;
+    state.handlers = {};
+    state.terminal = terminal;
+    state.untilDue = timeOf(patience.untilDue);
+    state.interval = timeOf(kInterval);
+    state.mostTicks =
+        static_cast<std::sig_atomic_t>((patience.untilDeath - patience.untilDue) / kInterval);
+    struct sigaction action {};
+    action.sa_handler = interrupt; // without SA_RESTART: interrupting is what it is for
+    (void)::sigfillset(&action.sa_mask);
+    (void)::sigaction(SIGALRM, &action, &state.alarmBefore);
+    state.isActive = ::timer_create(CLOCK_MONOTONIC, nullptr, &state.timer) == 0;
+}
+
+Interruption::~Interruption() {
+    if (state.isActive) {
+        (void)::timer_delete(state.timer);
+    }
+    (void)std::signal(SIGALRM, SIG_IGN); // one that is under way
+    (void)::sigaction(SIGALRM, &state.alarmBefore, nullptr);
+    state.isActive = false;
+    state.ticks = 0;
+    if (std::exchange(state.signal, 0) == SIGQUIT) {
+        (void)std::signal(SIGQUIT, SIG_DFL);
+        (void)std::raise(SIGQUIT);
+    }
+}
+
+void Interruption::watch(int signal) {
+    const std::size_t place = placeOf(signal);
+    struct sigaction present {};
+    if (!state.isActive || place == kEnding.size() || ::sigaction(signal, nullptr, &present) != 0 ||
+        present.sa_handler == endIsAsked) {
+        return;
+    }
+    state.handlers.at(place) = present.sa_handler;
+    struct sigaction action {};
+    action.sa_handler = endIsAsked;
+    action.sa_flags = static_cast<int>(SA_RESTART); // nothing is given up yet
+    (void)::sigfillset(&action.sa_mask);
+    (void)::sigaction(signal, &action, nullptr);
+}
+
+int Interruption::signal() {
+    return state.signal;
+}
+
+bool Interruption::isDue() {
+    return state.ticks > 0;
+}
+
+} // namespace pallax
