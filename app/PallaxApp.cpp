@@ -97,6 +97,7 @@ void PallaxApp::showSaveView() {
             .toolkit = _surroundings.toolkit,
             .files = _surroundings.files,
             .clock = _surroundings.clock,
+            .present = _surroundings.present,
             .queue = _surroundings.queue,
             .snapshotDirectory = _surroundings.snapshotDirectory,
             .closeSaveView = whileAlive(&PallaxApp::closeSaveView),

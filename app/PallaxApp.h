@@ -40,7 +40,8 @@ public:
         FileSystem& files;
         Preferences& preferences;
         MainQueue& queue;
-        const Clock& clock;
+        const Clock& clock;   ///< of the display: a recording's while one is played
+        const Clock& present; ///< names files
         ModelMaker makeModel;
         std::string snapshotDirectory = std::string(kSnapshotDirectory);
         std::string saveButtonMarker = std::string(kSaveButtonMarker);

@@ -5,6 +5,7 @@
 #include "platform/Format.h"
 #include "platform/MainQueue.h"
 #include "platform/SystemLog.h"
+#include "platform/XmlWritable.h"
 
 #include <utility>
 
@@ -52,12 +53,18 @@ void PallaxSaveViewController::viewWillAppear(bool /*animated*/) {
 std::string PallaxSaveViewController::snapshotPath() const {
     return formatText("%@/PallaxSnapshot-%ld.pallax",
                       {_surroundings.snapshotDirectory,
-                       dateOf(_surroundings.clock.now()).time_since_epoch().count()});
+                       dateOf(_surroundings.present.now()).time_since_epoch().count()});
 }
 
 void PallaxSaveViewController::savePressed() {
     _surroundings.catchUp();
-    const Dictionary root = snapshot(dateText(_timeStamp), _saveHistory, saveDescription().text());
+    const PropertyList root = writableInXml(
+        snapshot(dateText(_timeStamp), _saveHistory, saveDescription().text()),
+        [](const std::string& place) {
+            systemLog(LogPriority::Warning,
+                      "Characters that XML cannot hold are written as U+FFFD in the snapshot's %@",
+                      place);
+        });
     const std::string path = snapshotPath();
     if (!_surroundings.files.writePropertyList(path, root)) {
         reportFailure(path);

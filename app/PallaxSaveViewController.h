@@ -25,7 +25,8 @@ public:
     struct Surroundings {
         ui::Toolkit& toolkit;
         FileSystem& files;
-        const Clock& clock;
+        const Clock& clock;   ///< of the display: stamps the screen
+        const Clock& present; ///< names the file
         MainQueue& queue;
         std::string snapshotDirectory;
         /// The application's; posted to the queue, where it may run after the screen's end.
@@ -46,8 +47,9 @@ public:
     /// Takes the application's area of the screen and leaves the toolkit's own handling out.
     void viewWillAppear(bool animated) override;
 
-    /// Writes the file. Whether that succeeds or not, the screen is closed afterwards; a failure
-    /// is logged and shown as an alert.
+    /// Writes the file; for a character that it cannot hold stands U+FFFD, which is logged. Whether
+    /// that succeeds or not, the screen is closed afterwards; a failure is logged and shown as an
+    /// alert.
     void savePressed() override;
     void cancelPressed() override;
     void backgroundTouched() override;

@@ -35,6 +35,7 @@ public:
 
     AsioMainQueue& queue() { return _queue; }
     SourceClock& clock() { return _clock; }
+    const Clock& present() const { return _wallClock; }
     PallaxModel::Platform modelPlatform(ModelObserver& observer);
     /// See LinkPorts.
     const std::string& obstacle() const { return _linkPorts.obstacle(); }

@@ -49,6 +49,7 @@ PallaxApp::Surroundings ScreenBrowser::applicationSurroundings(const Settings& s
                                          _preferences,
                                          _link.queue(),
                                          _link.clock(),
+                                         _link.present(),
                                          [this](ModelObserver& observer) {
                                              auto model = std::make_unique<PallaxModel>(
                                                  _link.modelPlatform(observer));

@@ -16,8 +16,6 @@ namespace pallax {
 
 namespace {
 
-constexpr mode_t kFileMode = S_IRUSR | S_IWUSR | S_IRGRP | S_IROTH; // less the user's mask
-
 bool writeAll(const Descriptor& file, std::string_view content) {
     while (!content.empty()) {
         const ssize_t written = ::write(file.number(), content.data(), content.size());
@@ -64,10 +62,15 @@ std::optional<ByteBuffer> readFile(const std::string& path, std::size_t largest)
     return content ? std::optional(std::move(content).value()) : std::nullopt;
 }
 
-bool writeFile(const std::string& path, std::string_view content) {
-    const Descriptor file(
-        ::open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, kFileMode));
-    return file && writeAll(file, content);
+bool writePrivateFile(const std::string& path, std::string_view content) {
+    constexpr mode_t kUsersOwn = S_IRUSR | S_IWUSR;
+    constexpr int kWaitForNobody = O_NONBLOCK | O_NOCTTY;
+    const Descriptor file(::open(
+        path.c_str(), O_WRONLY | O_CREAT | O_NOFOLLOW | O_CLOEXEC | kWaitForNobody, kUsersOwn));
+    struct stat status {};
+    return file && ::fstat(file.number(), &status) == 0 && S_ISREG(status.st_mode) &&
+           ::fchmod(file.number(), kUsersOwn) == 0 && ::ftruncate(file.number(), 0) == 0 &&
+           writeAll(file, content);
 }
 
 bool replaceFile(const std::string& path, std::string_view content) {

@@ -21,8 +21,9 @@ Result<ByteBuffer, ReadFailure> readRegularFile(const std::string& path, std::si
 /// The same where nobody asks why.
 std::optional<ByteBuffer> readFile(const std::string& path, std::size_t largest);
 
-/// Writes straight to the path; false when that failed.
-bool writeFile(const std::string& path, std::string_view content);
+/// Writes straight to the path, a file that only its user may read; false when that failed. What
+/// stands there is replaced if it is a file; a symbolic link, a pipe or a device is refused.
+bool writePrivateFile(const std::string& path, std::string_view content);
 
 /// Replaces the file in one step: whoever reads it sees the old content or the new one, also
 /// after a crash. False, with the old content in place, when that failed.

@@ -14,7 +14,7 @@ bool HostFileSystem::exists(const std::string& path) const {
 
 bool HostFileSystem::writePropertyList(const std::string& path, const PropertyList& object) {
     const auto text = serializeXml(object);
-    return text && writeFile(path, *text);
+    return text && writePrivateFile(path, *text);
 }
 
 } // namespace pallax

@@ -62,6 +62,7 @@ protected:
             .preferences = *usedPreferences,
             .queue = queue,
             .clock = clock,
+            .present = present,
             .makeModel = [this](ModelObserver& application) { return makeModel(application); }};
         if (!snapshotDirectory.empty()) {
             surroundings.snapshotDirectory = snapshotDirectory;
@@ -86,6 +87,7 @@ protected:
     /// The clock moves first, so that what falls due finds the time it is due at.
     void advance(std::chrono::nanoseconds duration) {
         clock.advance(duration);
+        present.advance(duration);
         queue.advance(duration);
     }
 
@@ -126,6 +128,7 @@ protected:
         return rows;
     }
 
+    ManualClock present;
     FakeToolkit toolkit;
     FakeFileSystem files;
     FakePreferences preferences;

@@ -50,6 +50,7 @@ protected:
             PallaxSaveViewController::Surroundings{.toolkit = toolkit,
                                                    .files = files,
                                                    .clock = clock,
+                                                   .present = present,
                                                    .queue = queue,
                                                    .snapshotDirectory =
                                                        "/var/mobile/Library/Logs/Faultbox",
@@ -67,6 +68,7 @@ protected:
     FakeToolkit toolkit;
     FakeFileSystem files;
     ManualClock clock;
+    ManualClock present;
     SteppedQueue queue;
     RecordingLog log;
     int closes = 0;
@@ -233,7 +235,8 @@ TEST_F(PallaxSaveViewControllerTest, ItemsAndTimestampAreThoseOfTheCreation) {
     const auto made = open(two);
     contents->push_back(entry("Snapshot (later)"));
     contents->erase(contents->begin());
-    clock.advance(70s);
+    clock.advance(1h);
+    present.advance(70s);
     EXPECT_EQ(made->numberOfRows(), 2U);
     EXPECT_EQ(made->textOfRow(0).name, "Snapshot (one)");
     made->savePressed();
@@ -249,13 +252,54 @@ TEST_F(PallaxSaveViewControllerTest, TwoSavesWithinOneSecondWriteTheSameFile) {
     const auto first = open(two);
     field().typed = "first";
     first->savePressed();
-    clock.advance(999ms);
+    present.advance(999ms);
     const auto second = open(two);
     field().typed = "second";
     second->savePressed();
     ASSERT_EQ(files.files.size(), 1U);
     EXPECT_EQ(*files.files.at(kStandingPath).dictionary()->find("Description"),
               PropertyList("second"));
+}
+
+TEST_F(PallaxSaveViewControllerTest, TheFilesNameIsThePresentWhileTheDisplaysClockStands) {
+    present.set(Time(1800000000s));
+    for (int save = 0; save < 2; ++save) {
+        const auto made = open(two);
+        made->savePressed();
+        present.advance(5s);
+    }
+    ASSERT_EQ(files.files.size(), 2U) << "none has replaced the other";
+    const std::string folder = "/var/mobile/Library/Logs/Faultbox/";
+    for (const char* name :
+         {"PallaxSnapshot-1800000000.pallax", "PallaxSnapshot-1800000005.pallax"}) {
+        ASSERT_TRUE(files.exists(folder + name)) << name;
+        EXPECT_EQ(*files.files.at(folder + name).dictionary()->find("Timestamp"),
+                  PropertyList("2023-11-14 22:13:20 +0000"));
+    }
+}
+
+TEST_F(PallaxSaveViewControllerTest, WhatXmlCannotHoldIsReplacedAndNamedInTheLog) {
+    const auto made =
+        open(Array{Dictionary{{"Display", Dictionary{{"Cell", Dictionary{{"Name", "a\x1b[31mb"}}},
+                                                     {"Fine", "tab\tand line\n"}}},
+                              {"Description", "Snapshot (one)"}}});
+    field().typed = "typed\x01";
+    made->savePressed();
+    EXPECT_TRUE(sameInOrder(
+        *files.files.at(kStandingPath).dictionary(),
+        {{"Timestamp", "2023-11-14 22:13:20 +0000"},
+         {"Data", Array{Dictionary{
+                      {"Display", Dictionary{{"Cell", Dictionary{{"Name", "a\xEF\xBF\xBD[31mb"}}},
+                                             {"Fine", "tab\tand line\n"}}},
+                      {"Description", "Snapshot (one)"}}}},
+         {"Description", "typed\xEF\xBF\xBD"}}));
+    EXPECT_TRUE(serializeXml(files.files.at(kStandingPath)));
+    EXPECT_EQ(log.lines(),
+              (Lines{{4, "Characters that XML cannot hold are written as U+FFFD in the snapshot's "
+                         "/Data/0/Display/Cell/Name"},
+                     {4, "Characters that XML cannot hold are written as U+FFFD in the snapshot's "
+                         "/Description"}}));
+    EXPECT_EQ(toolkit.alerts.size(), 0U);
 }
 
 TEST_F(PallaxSaveViewControllerTest, TheScreenIsClosedOnTheQueueAfterTheSave) {

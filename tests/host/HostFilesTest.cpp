@@ -1,4 +1,5 @@
 #include "host/BuildBundle.h"
+#include "host/Descriptor.h"
 #include "host/DirectoryResources.h"
 #include "host/FilePreferences.h"
 #include "host/Files.h"
@@ -10,8 +11,11 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <array>
 #include <cstdlib>
 #include <ctime>
+#include <fcntl.h>
+#include <filesystem>
 #include <regex>
 #include <sys/stat.h>
 
@@ -42,7 +46,45 @@ TEST_F(HostFilesTest, APropertyListIsWrittenAsXmlAndAFailureIsTold) {
     EXPECT_TRUE(files.writePropertyList(_folder.file("a.pallax"), object));
     EXPECT_EQ(parsed("a.pallax"), object);
     EXPECT_FALSE(files.writePropertyList(_folder.file("absent/a.pallax"), object));
-    EXPECT_FALSE(files.writePropertyList("/dev/full", object));
+}
+
+TEST_F(HostFilesTest, APropertyListIsItsUsersAloneAlsoWhereItReplacesAFile) {
+    HostFileSystem files;
+    const auto modeOf = [](const std::string& path) {
+        struct stat status {};
+        EXPECT_EQ(::lstat(path.c_str(), &status), 0);
+        return status.st_mode & 0777U;
+    };
+    const std::string path = _folder.file("a.pallax");
+    EXPECT_TRUE(files.writePropertyList(path, "first, and longer"));
+    EXPECT_EQ(modeOf(path), 0600U);
+    ASSERT_EQ(::chmod(path.c_str(), 0644), 0);
+    EXPECT_TRUE(files.writePropertyList(path, "second"));
+    EXPECT_EQ(modeOf(path), 0600U);
+    EXPECT_EQ(parsed("a.pallax"), PropertyList("second"));
+}
+
+TEST_F(HostFilesTest, ALinkAPipeAndADeviceAreNotWrittenTo) {
+    HostFileSystem files;
+    const std::string target = _folder.write("target", "before");
+    const std::string link = _folder.file("link");
+    std::filesystem::create_symlink(target, link);
+    EXPECT_FALSE(files.writePropertyList(link, "snapshot"));
+    EXPECT_EQ(doubles::contentOf(target), "before");
+    std::filesystem::create_symlink(_folder.file("absent"), _folder.file("dangling"));
+    EXPECT_FALSE(files.writePropertyList(_folder.file("dangling"), "snapshot"));
+    EXPECT_FALSE(files.exists(_folder.file("absent")));
+
+    const std::string pipe = _folder.file("pipe");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+    EXPECT_FALSE(files.writePropertyList(pipe, "snapshot")) << "without waiting for a reader";
+    const Descriptor reader(::open(pipe.c_str(), O_RDWR | O_NONBLOCK | O_CLOEXEC));
+    EXPECT_FALSE(files.writePropertyList(pipe, "snapshot"));
+    std::array<char, 1> nothing{};
+    EXPECT_EQ(::read(reader.number(), nothing.data(), 1), -1);
+
+    EXPECT_FALSE(files.writePropertyList("/dev/null", "snapshot"));
+    EXPECT_FALSE(files.writePropertyList(_folder.path(), "snapshot"));
 }
 
 TEST_F(HostFilesTest, APropertyListIsWrittenInPlace) {
