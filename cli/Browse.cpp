@@ -41,12 +41,24 @@ struct Request {
     bool isOnScreen;
 };
 
+/// What is browsed, for sentences about it.
+std::string sourceName(const BrowseOptions& options) {
+    if (options.simulation) {
+        return "the simulation";
+    }
+    if (!options.recording) {
+        return "the service";
+    }
+    return options.recording == "-" ? "standard input" : *options.recording;
+}
+
 /// False when the child (null where the machine's own service is asked) ended too early.
 bool browseInPrint(const Request& request, SocketDirectory directory, ChildService* child) {
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     bool isWhole = false;
     try {
-        PrintBrowser browser(std::move(directory), request.onFatalRecord, child, output);
+        PrintBrowser browser(std::move(directory), request.onFatalRecord, child, output,
+                             sourceName(request.options));
         isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // what was printed, and the generators' last words

@@ -2,6 +2,9 @@
 
 #include "cli/FatalRecord.h"
 #include "cli/Preconditions.h"
+#include "cli/StampSentence.h"
+
+#include <utility>
 
 namespace pallax {
 
@@ -72,8 +75,19 @@ ExitStatus DecodeCommand::decode(Recording& recording, DisplayOutput& output) {
 }
 
 ExitStatus DecodeCommand::decodePackets(Recording& recording, RecordingDecoder& decoder) {
+    bool toldOutOfRange = false;
     while (const auto packet = recording.next()) {
-        if (const auto reason = decoder.add(*packet)) {
+        const auto reason = decoder.add(*packet);
+        const auto tell = [&](const StampRemark& remark) {
+            _report(stampSentence(recording.name(), decoder.packets(), remark));
+        };
+        if (packet->isOutOfRange && !std::exchange(toldOutOfRange, true)) {
+            tell({StampRemark::Kind::OutOfRange, {}});
+        }
+        if (decoder.step()) {
+            tell(*decoder.step());
+        }
+        if (reason) {
             _report(recording.name() + ": " +
                     fatalRecordSentence(decoder.packets(), packet->data, *reason));
             if (_options.strict) {

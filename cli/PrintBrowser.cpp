@@ -3,6 +3,7 @@
 #include "app/HomeScreenPreference.h"
 #include "cli/Output.h"
 #include "cli/Programs.h"
+#include "cli/StampSentence.h"
 #include "cli/WaitNotice.h"
 #include "host/FilePreferences.h"
 
@@ -18,8 +19,9 @@ void PrintBrowser::Notices::printLine(std::string_view line) {
 }
 
 PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
-                           ChildService* child, Output& output)
-    : _notices(output), _link(std::move(directory), onFatalRecord, child, _notices),
+                           ChildService* child, Output& output, std::string source)
+    : _source(std::move(source)), _notices(output),
+      _link(std::move(directory), onFatalRecord, child, _notices),
       _printer(output, _link.clock(), [this] { return _model.topLevelNodes(); }),
       _model(_link.modelPlatform(_printer)) {}
 
@@ -31,6 +33,9 @@ PrintBrowser::~PrintBrowser() {
 bool PrintBrowser::run() {
     AsioMainQueue& queue = _link.queue();
     queue.onSignal({SIGINT, SIGTERM, SIGHUP, SIGQUIT}, [&queue](int /*signal*/) { queue.stop(); });
+    _link.clock().onStampRemark([this](std::uint32_t packet, const StampRemark& remark) {
+        complain(stampSentence(_source, packet, remark));
+    });
     if (_link.hasChild()) {
         // The last tick has posted its view update before; that is to come first.
         _link.clock().onEnd([&queue] { queue.async([&queue] { queue.stop(); }); });

@@ -5,6 +5,8 @@
 #include "monitor/PallaxModel.h"
 #include "platform/StandardOutput.h"
 
+#include <string>
+
 namespace pallax {
 
 class Output;
@@ -12,8 +14,9 @@ class Output;
 /// Browses without a terminal: a model, and the printer that shows it.
 class PrintBrowser {
 public:
+    /// `source` names what is browsed, for sentences about it.
     PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                 Output& output);
+                 Output& output, std::string source);
     /// Whatever ended it: switches the home-screen preference off, as the application does.
     ~PrintBrowser();
     PrintBrowser(const PrintBrowser&) = delete;
@@ -36,6 +39,7 @@ private:
 
     void look();
 
+    std::string _source;
     bool _childLost = false;
     Notices _notices;
     BrowseLink _link;

@@ -4,7 +4,6 @@
 #include "host/Recording.h"
 #include "platform/Format.h"
 #include "platform/PropertyListCodec.h"
-#include "platform/TimeGrid.h"
 #include "telephony/ControlMessages.h"
 
 #include <algorithm>
@@ -77,7 +76,6 @@ bool Recorder::replied(Bytes reply) {
     }
     if (technology != nullptr) { // otherwise, as for the model, the earlier one stays
         _technology = technology;
-        _isNewLink = true;
     }
     return true;
 }
@@ -86,28 +84,12 @@ void Recorder::packetArrived(Bytes packet) {
     if (_technology == nullptr || _isOver) {
         return;
     }
-    const auto error = _files.add(*_technology, stamp(), packet);
+    const auto error = _files.add(*_technology, _link.clock().stamp(), packet);
     if (error && error->readerHasGone) {
         stop();
     } else if (error) {
         fail(formatText("%@ %llu packets are recorded.", {error->sentence, _files.packets()}));
     }
-}
-
-/// When the packet arrived by its source's time. A source that begins again after the link was lost
-/// goes on at the next tick, so that the stamps of a file never step back.
-Time Recorder::stamp() {
-    const Time now = _link.clock().now();
-    const bool beginsAgain = std::exchange(_isNewLink, false) && _first && now + _shift <= _latest;
-    if (!_first) {
-        _first = now;
-        _latest = now;
-    }
-    if (beginsAgain) {
-        _shift = TimeGrid(*_first, PallaxModel::kDisplayInterval).nextAfter(_latest) - now;
-    }
-    _latest = std::max(_latest, now + _shift);
-    return now + _shift;
 }
 
 void Recorder::fail(std::string sentence) {

@@ -17,7 +17,8 @@
 namespace pallax {
 
 /// Records what a viewer would be shown: a model opens the log channel and keeps it open, and the
-/// packets go into files instead of into a display, each with its source's time.
+/// packets go into files instead of into a display, each with its source's
+/// stamp, whatever that is.
 class Recorder final : private LinkListener, private ModelObserver {
 public:
     /// Gets, about once a second, how far it has come.
@@ -47,7 +48,6 @@ private:
     void packetArrived(Bytes packet) override;
     void updateViewControllerFromModel() override {}
     PallaxModel::Platform platform();
-    Time stamp();
     void tellProgress();
     void fail(std::string sentence);
     void stop();
@@ -57,10 +57,6 @@ private:
     Progress _progress;
     Progress _waits;
     const RecordedTechnology* _technology = nullptr; // that the modem has answered
-    bool _isNewLink = false;                         // no packet has come over it yet
-    std::optional<Time> _first;                      // stamp of the first packet
-    Time _latest;                                    // the latest stamp
-    std::chrono::nanoseconds _shift{0};              // from the source's time to the stamps
     bool _isOver = false;                            // nothing more is written
     std::optional<std::string> _failure;
     std::uint64_t _packetsTold = 0;

@@ -56,6 +56,8 @@ public:
     void finish();
 
     std::uint64_t packets() const { return _packets; }
+    /// How the latest packet's stamp stepped, if it did.
+    const std::optional<StampRemark>& step() const { return _grid.step(); }
 
 private:
     void tick(const TickGrid::Tick& tick);

@@ -35,9 +35,10 @@ std::optional<HostError> RecordingFiles::add(const RecordedTechnology& technolog
     if (auto error = _file->write(*interface, time, packet)) {
         return error;
     }
-    if (!_begin) {
-        _begin = time;
+    if (_options.rotateAfter && _stamps.wouldStepBack(time)) {
+        _covered += _stamps.latest() - _stamps.first();
     }
+    _stamps.take(time);
     ++_packets;
     _bytes += packet.size();
     return std::nullopt;
@@ -45,12 +46,14 @@ std::optional<HostError> RecordingFiles::add(const RecordedTechnology& technolog
 
 /// A file that holds no packet yet takes the next one, whatever the limits are.
 bool RecordingFiles::isFull(Time time, std::size_t length) const {
-    if (!_begin) {
+    if (_stamps.isEmpty()) {
         return false;
     }
     const bool big = _options.rotateSize &&
                      _file->size() + PcapNgWriter::sizeOfPacket(length) > *_options.rotateSize;
-    return big || (_options.rotateAfter && time - *_begin >= *_options.rotateAfter);
+    const Time latest = _stamps.wouldStepBack(time) ? _stamps.latest() : time;
+    return big ||
+           (_options.rotateAfter && latest - _stamps.first() >= *_options.rotateAfter - _covered);
 }
 
 /// A number whose file exists is passed over rather than ending a recording that runs.
@@ -66,7 +69,8 @@ std::optional<HostError> RecordingFiles::nextFile() {
         return file.error();
     }
     _file = std::move(file).value();
-    _begin.reset();
+    _stamps = {};
+    _covered = {};
     return std::nullopt;
 }
 

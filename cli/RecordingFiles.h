@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/PcapNgWriter.h"
+#include "platform/StampSequence.h"
 
 #include <chrono>
 #include <cstdint>
@@ -48,8 +49,9 @@ private:
 
     Options _options;
     std::unique_ptr<PcapNgWriter> _file;
-    unsigned _number = 1;       // of that file
-    std::optional<Time> _begin; // of its first packet
+    unsigned _number = 1;                 // of that file
+    StampSequence _stamps;                // of its packets
+    std::chrono::nanoseconds _covered{0}; // by its stretches of time before the present one
     std::uint64_t _packets = 0;
     std::uint64_t _bytes = 0;
     std::uint64_t _tooLarge = 0;

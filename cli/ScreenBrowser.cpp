@@ -1,6 +1,7 @@
 #include "cli/ScreenBrowser.h"
 
 #include "cli/Settings.h"
+#include "cli/StampSentence.h"
 #include "cli/WaitNotice.h"
 
 #include <chrono>
@@ -74,6 +75,9 @@ bool ScreenBrowser::run() {
         } else {
             _link.queue().stop();
         }
+    });
+    _link.clock().onStampRemark([this](std::uint32_t packet, const StampRemark& remark) {
+        _frontEnd.setNote(stampNote(packet, remark));
     });
     if (_link.hasChild()) {
         _link.clock().onEnd([this] { _frontEnd.setNote("End of the recording"); });

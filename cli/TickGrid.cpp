@@ -3,10 +3,16 @@
 namespace pallax {
 
 std::optional<TickGrid::Tick> TickGrid::passedBefore(Time packet) {
-    if (!_grid) {
-        _grid.emplace(packet, kInterval);
+    _step = _stamps.stepTo(packet);
+    if (_stamps.wouldStepBack(packet)) {
+        const Tick last = next();
+        _passedBefore = last.number;
+        _passed = 0;
+        _stamps.take(packet);
+        return last;
     }
-    const std::uint64_t passed = _grid->passedAt(packet);
+    _stamps.take(packet);
+    const std::uint64_t passed = grid().passedAt(packet);
     if (passed <= _passed) {
         return std::nullopt;
     }
@@ -17,7 +23,7 @@ std::optional<TickGrid::Tick> TickGrid::passedBefore(Time packet) {
 
 TickGrid::Tick TickGrid::next() const {
     const std::uint64_t number = _passed + 1;
-    return {number, _grid->moment(number)};
+    return {_passedBefore + number, grid().moment(number)};
 }
 
 } // namespace pallax

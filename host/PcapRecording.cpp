@@ -26,11 +26,15 @@ RecordingError errorOf(Kind kind, const std::string& name, std::string_view what
     return {kind, formatText("%@ %@.", {name, what})};
 }
 
+/// How a file's stamps count seconds: pcap in 32 bits without a sign, which the library reads as
+/// signed; pcapng in 64 bits of its own units.
+enum class StampForm { Pcap, PcapNg };
+
 class PcapRecording final : public Recording {
 public:
-    PcapRecording(std::string name, pcap_t* capture, bool isStream)
+    PcapRecording(std::string name, pcap_t* capture, StampForm form, bool isStream)
         : _name(std::move(name)), _capture(capture), _linkType(pcap_datalink(capture)),
-          _isStream(isStream) {}
+          _form(form), _isStream(isStream) {}
     ~PcapRecording() override { pcap_close(_capture); }
     PcapRecording(const PcapRecording&) = delete;
     PcapRecording& operator=(const PcapRecording&) = delete;
@@ -50,6 +54,7 @@ private:
     std::string _name;
     pcap_t* _capture;
     int _linkType;
+    StampForm _form;
     bool _isStream;
     std::optional<RecordingError> _error;
     bool _ended = false;
@@ -67,13 +72,26 @@ RecordingError PcapRecording::foreignLinkType() const {
                               {_linkType, known}));
 }
 
-/// A moment of any file, bounded to what a Time can hold.
-Time timeOf(const timeval& stamp) {
-    constexpr std::int64_t kLatestSecond = 9'000'000'000; // in the year 2255
-    const std::int64_t seconds = std::clamp<std::int64_t>(stamp.tv_sec, 0, kLatestSecond);
+struct Stamp {
+    Time time;
+    bool isOutOfRange;
+};
+
+/// A moment of any file, or the nearest one that a recording may have.
+Stamp stampOf(const timeval& stamp, StampForm form) {
+    constexpr std::int64_t kMostNanoseconds = 999'999'999;
+    const std::int64_t seconds =
+        form == StampForm::Pcap ? static_cast<std::uint32_t>(stamp.tv_sec) : stamp.tv_sec;
     // Opened for nanoseconds, which then stand in the field for microseconds.
-    const std::int64_t nanoseconds = std::clamp<std::int64_t>(stamp.tv_usec, 0, 999'999'999);
-    return Time(std::chrono::seconds(seconds) + std::chrono::nanoseconds(nanoseconds));
+    const std::int64_t rest = std::clamp<std::int64_t>(stamp.tv_usec, 0, kMostNanoseconds);
+    if (seconds < dateOf(kEarliestTime).time_since_epoch().count()) {
+        return {kEarliestTime, true};
+    }
+    if (seconds >= dateOf(kLatestTime).time_since_epoch().count()) {
+        return {kLatestTime, true};
+    }
+    return {Time(std::chrono::seconds(seconds) + std::chrono::nanoseconds(rest)),
+            rest != stamp.tv_usec};
 }
 
 std::optional<RecordedPacket> PcapRecording::next() {
@@ -81,7 +99,8 @@ std::optional<RecordedPacket> PcapRecording::next() {
     const u_char* data = nullptr;
     const int status = _ended ? PCAP_ERROR_BREAK : pcap_next_ex(_capture, &header, &data);
     if (status == 1) {
-        return RecordedPacket{timeOf(header->ts), Bytes(data, header->caplen)};
+        const Stamp stamp = stampOf(header->ts, _form);
+        return RecordedPacket{stamp.time, Bytes(data, header->caplen), stamp.isOutOfRange};
     }
     if (status == PCAP_ERROR) {
         // A read that met the end of the file in the middle of something.
@@ -176,8 +195,10 @@ Recording::OpenResult Recording::openInput(const Input& input) {
     if (capture == nullptr) {
         return failed(noCapture(file, name, reason.data()));
     }
+    constexpr int kFirstOfPcapNg = 0x0A; // of its first block's type, in either byte order
+    const StampForm form = first == kFirstOfPcapNg ? StampForm::PcapNg : StampForm::Pcap;
     return std::unique_ptr<Recording>(
-        std::make_unique<PcapRecording>(name, capture, opened->isStream));
+        std::make_unique<PcapRecording>(name, capture, form, opened->isStream));
 }
 
 } // namespace pallax

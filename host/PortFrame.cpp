@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <limits>
+#include <span>
 #include <utility>
 
 namespace pallax {
@@ -14,38 +15,46 @@ constexpr unsigned kBitsPerByte = 8;
 
 // Offsets of the header's fields.
 constexpr std::size_t kKindAt = 4;
-constexpr std::size_t kReservedAt = 6;
+constexpr std::size_t kFlagsAt = 6;
 constexpr std::size_t kIdentifierAt = 8;
 constexpr std::size_t kLengthAt = 12;
 constexpr std::size_t kTimeAt = 16;
 constexpr std::size_t kRequestAt = 24;
 constexpr std::size_t kReservedTailAt = 28;
 
+constexpr std::uint16_t kLiveFlag = 1;
+
+// A remark's data.
+constexpr std::size_t kRemarkKindAt = 0;
+constexpr std::size_t kRemarkSizeAt = 4;
+constexpr std::size_t kRemarkLength = 12;
+
 using HeaderBytes = std::array<std::uint8_t, kFrameHeaderSize>;
 
 template <class Number>
-void put(HeaderBytes& bytes, std::size_t at, Number number) {
+void put(std::span<std::uint8_t> bytes, std::size_t at, Number number) {
     for (std::size_t index = 0; index < sizeof(Number); ++index) {
-        bytes.at(at + index) = static_cast<std::uint8_t>(number >> (index * kBitsPerByte));
+        bytes[at + index] = static_cast<std::uint8_t>(number >> (index * kBitsPerByte));
     }
 }
 
 template <class Number>
-Number get(const HeaderBytes& bytes, std::size_t at) {
+Number get(Bytes bytes, std::size_t at) {
     std::uint64_t number = 0;
     for (std::size_t index = 0; index < sizeof(Number); ++index) {
-        number |= static_cast<std::uint64_t>(bytes.at(at + index)) << (index * kBitsPerByte);
+        number |= static_cast<std::uint64_t>(bytes[at + index]) << (index * kBitsPerByte);
     }
     return static_cast<Number>(number);
 }
 
 bool isKnownKind(std::uint16_t kind) {
     return kind >= static_cast<std::uint16_t>(FrameKind::Message) &&
-           kind <= static_cast<std::uint16_t>(FrameKind::End);
+           kind <= static_cast<std::uint16_t>(FrameKind::Remark);
 }
 
 bool carriesData(FrameKind kind) {
-    return kind == FrameKind::Message || kind == FrameKind::Request || kind == FrameKind::Reply;
+    return kind == FrameKind::Message || kind == FrameKind::Request || kind == FrameKind::Reply ||
+           kind == FrameKind::Remark;
 }
 
 } // namespace
@@ -54,6 +63,7 @@ HeaderBytes encodeHeader(const FrameHeader& header, std::size_t length) {
     HeaderBytes bytes{};
     std::copy(kMagic.begin(), kMagic.end(), bytes.begin());
     put(bytes, kKindAt, static_cast<std::uint16_t>(header.kind));
+    put(bytes, kFlagsAt, header.isLive ? kLiveFlag : std::uint16_t{0});
     put(bytes, kIdentifierAt, static_cast<std::uint32_t>(header.identifier));
     put(bytes, kLengthAt, static_cast<std::uint32_t>(length));
     const std::int64_t time =
@@ -61,6 +71,26 @@ HeaderBytes encodeHeader(const FrameHeader& header, std::size_t length) {
     put(bytes, kTimeAt, static_cast<std::uint64_t>(time));
     put(bytes, kRequestAt, header.number);
     return bytes;
+}
+
+ByteBuffer encodeRemark(const StampRemark& remark) {
+    ByteBuffer data(kRemarkLength);
+    put(data, kRemarkKindAt, static_cast<std::uint32_t>(remark.kind));
+    put(data, kRemarkSizeAt, static_cast<std::uint64_t>(remark.size.count()));
+    return data;
+}
+
+std::optional<StampRemark> decodeRemark(Bytes data) {
+    if (data.size() != kRemarkLength) {
+        return std::nullopt;
+    }
+    const auto kind = get<std::uint32_t>(data, kRemarkKindAt);
+    const auto size = static_cast<std::int64_t>(get<std::uint64_t>(data, kRemarkSizeAt));
+    if (kind < static_cast<std::uint32_t>(StampRemark::Kind::StepBack) ||
+        kind > static_cast<std::uint32_t>(StampRemark::Kind::OutOfRange) || size < 0) {
+        return std::nullopt;
+    }
+    return StampRemark{static_cast<StampRemark::Kind>(kind), std::chrono::nanoseconds(size)};
 }
 
 void appendFrame(ByteBuffer& out, const FrameHeader& header, Bytes data) {
@@ -114,13 +144,15 @@ std::size_t PortFrameParser::feedData(Bytes bytes) {
 
 void PortFrameParser::decodeHeader() {
     const auto kind = get<std::uint16_t>(_headerBytes, kKindAt);
+    const auto flags = get<std::uint16_t>(_headerBytes, kFlagsAt);
     _length = get<std::uint32_t>(_headerBytes, kLengthAt);
     if (!std::equal(kMagic.begin(), kMagic.end(), _headerBytes.begin())) {
         _fault = "no frame where one should begin";
     } else if (!isKnownKind(kind)) {
         _fault = "an unknown kind of frame";
-    } else if (get<std::uint16_t>(_headerBytes, kReservedAt) != 0 ||
-               get<std::uint32_t>(_headerBytes, kReservedTailAt) != 0) {
+    } else if ((flags & ~kLiveFlag) != 0) {
+        _fault = "an unknown flag";
+    } else if (get<std::uint32_t>(_headerBytes, kReservedTailAt) != 0) {
         _fault = "a reserved field that is not zero";
     } else if (_length > kLargestMessage) {
         _fault = "a message of more than 16 MiB";
@@ -131,6 +163,7 @@ void PortFrameParser::decodeHeader() {
     header.kind = static_cast<FrameKind>(kind);
     header.identifier = static_cast<std::int32_t>(get<std::uint32_t>(_headerBytes, kIdentifierAt));
     header.number = get<std::uint32_t>(_headerBytes, kRequestAt);
+    header.isLive = (flags & kLiveFlag) != 0;
     const auto time = static_cast<std::int64_t>(get<std::uint64_t>(_headerBytes, kTimeAt));
     header.sourceTime =
         time == kNoTime ? std::nullopt : std::optional(Time(std::chrono::nanoseconds(time)));

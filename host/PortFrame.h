@@ -2,6 +2,7 @@
 
 #include "platform/Bytes.h"
 #include "platform/Date.h"
+#include "platform/StampSequence.h"
 
 #include <array>
 #include <cstddef>
@@ -14,13 +15,17 @@
 ///   offset  width  field
 ///   0       4      magic, "PLXM"
 ///   4       2      kind, see FrameKind
-///   6       2      reserved, zero
+///   6       2      flags; bit 0: the source is live, its times are those of its stamps and drive
+///                  no timers; the others are zero
 ///   8       4      message identifier, signed
 ///   12      4      length of the data that follows the header, at most 16 MiB
 ///   16      8      source time: signed nanoseconds since the epoch; the smallest number: none
 ///   24      4      number: a reply carries that of its request; a message that of its packet in
-///                  the source, counted from 1 (0: not told); otherwise zero
+///                  the source, counted from 1 (0: not told); a remark that of the packet that it
+///                  is about; otherwise zero
 ///   28      4      reserved, zero
+///
+/// The data of a remark are its kind, 4 bytes, and its size in nanoseconds, 8 bytes.
 ///
 /// A peer that sends anything else is cut off.
 namespace pallax {
@@ -32,6 +37,7 @@ enum class FrameKind : std::uint16_t {
     NoReply = 4, ///< the receiver of a request has nothing to answer
     Clock = 5,   ///< no data: the source's clock stands at the source time
     End = 6,     ///< no data: the source has come to its end
+    Remark = 7,  ///< what is odd about a packet's stamp, see StampRemark
 };
 
 inline constexpr std::size_t kFrameHeaderSize = 32;
@@ -43,6 +49,7 @@ struct FrameHeader {
     std::int32_t identifier = 0;
     std::uint32_t number = 0;
     std::optional<Time> sourceTime;
+    bool isLive = false;
 
     friend bool operator==(const FrameHeader&, const FrameHeader&) = default;
 };
@@ -57,6 +64,10 @@ struct PortFrame {
 /// The header of a frame whose data has `length` bytes (at most kLargestMessage).
 std::array<std::uint8_t, kFrameHeaderSize> encodeHeader(const FrameHeader& header,
                                                         std::size_t length);
+/// The data of a remark's frame.
+ByteBuffer encodeRemark(const StampRemark& remark);
+/// Nothing for what is no remark.
+std::optional<StampRemark> decodeRemark(Bytes data);
 /// Appends a whole frame.
 void appendFrame(ByteBuffer& out, const FrameHeader& header, Bytes data);
 

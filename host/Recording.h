@@ -32,6 +32,8 @@ const RecordedTechnology* technologyOfCommandName(std::string_view name);
 struct RecordedPacket {
     Time time;
     Bytes data; ///< valid until the next call
+    /// The stamp is no time from kEarliestTime to kLatestTime; the nearest one is taken.
+    bool isOutOfRange = false;
 };
 
 /// Why a recording cannot be opened or read on: one clear sentence that names the file.

@@ -69,6 +69,7 @@ private:
     void step();
     bool readChunk(State& port);
     void handle(const std::shared_ptr<State>& port);
+    void tellRemark(SourceTimeListener* times, const PortFrame& frame);
     void deliver(const std::shared_ptr<State>& port, const PortFrame& frame);
     void answer(const PortFrame& request, const std::optional<ByteBuffer>& reply);
     void flush();
@@ -163,7 +164,7 @@ void SocketLocalPort::Session::handle(const std::shared_ptr<State>& port) {
     if (times != nullptr && _frame->header.sourceTime) {
         if (!_tellsTime) {
             _tellsTime = true;
-            times->sourceBegan();
+            times->sourceBegan(_frame->header.isLive);
         }
         if (times->advance(*_frame->header.sourceTime)) {
             stepLater(); // the frame waits behind what the ticks have posted
@@ -191,11 +192,26 @@ void SocketLocalPort::Session::handle(const std::shared_ptr<State>& port) {
     case FrameKind::Clock:
         stepLater();
         return;
+    case FrameKind::Remark:
+        tellRemark(times, frame);
+        return;
     case FrameKind::Reply:
     case FrameKind::NoReply:
         break;
     }
     cutOff(); // nobody has asked
+}
+
+void SocketLocalPort::Session::tellRemark(SourceTimeListener* times, const PortFrame& frame) {
+    const auto remark = decodeRemark(frame.data);
+    if (!remark) {
+        cutOff();
+        return;
+    }
+    stepLater();
+    if (times != nullptr) {
+        times->stampRemark(frame.header.number, *remark);
+    }
 }
 
 /// Touches nothing of the port after the callback but what it has kept alive: the callback may

@@ -4,24 +4,14 @@
 
 #include <algorithm>
 #include <utility>
+#include <vector>
 
 namespace pallax {
-
-namespace {
-
-/// Source times come from outside; within these bounds (1970 to 2116) no difference and no sum
-/// with an interval can overflow.
-Time bounded(Time time) {
-    constexpr Time kLatest{std::chrono::nanoseconds(std::int64_t{1} << 62U)};
-    return std::clamp(time, Time{}, kLatest);
-}
-
-} // namespace
 
 struct SourceClock::TimerState {
     std::chrono::nanoseconds interval;
     std::function<void()> action;
-    std::optional<Time> due; ///< nothing before the first source time
+    std::optional<Time> due; ///< nothing before a stretch of source times has begun
     bool alive = true;
     std::unique_ptr<RepeatingTimer> wallTimer;
 };
@@ -50,15 +40,24 @@ SourceClock::SourceClock(const Clock& wallClock, TimerScheduler& wallTimers, Ste
 SourceClock::~SourceClock() = default;
 
 Time SourceClock::now() const {
-    return _now ? *_now : _wallClock.now();
+    if (_isLive || !_now) {
+        return _wallClock.now();
+    }
+    const bool runsOn = !_hasEnded && silence() > kSilence;
+    return runsOn ? std::min(*_now + silence(), kLatestTime) : *_now;
 }
 
 Clock::Zone SourceClock::zone(Time time) const {
     return _wallClock.zone(time);
 }
 
-bool SourceClock::isSilent() const {
-    return !_heard || _steadyNow() - *_heard >= kSilence;
+/// For how long no source time has been heard, once one has.
+std::chrono::nanoseconds SourceClock::silence() const {
+    return _steadyNow() - *_heard;
+}
+
+bool SourceClock::firesByTheWall() const {
+    return _isLive || !_heard || silence() >= kSilence;
 }
 
 std::unique_ptr<RepeatingTimer> SourceClock::scheduleRepeating(std::chrono::nanoseconds interval,
@@ -66,13 +65,11 @@ std::unique_ptr<RepeatingTimer> SourceClock::scheduleRepeating(std::chrono::nano
     auto state = std::make_shared<TimerState>();
     state->interval = std::max(interval, std::chrono::nanoseconds(1));
     state->action = std::move(action);
-    if (_first) {
-        state->due = TimeGrid(*_first, state->interval).nextAfter(*_now);
-    }
+    state->due = nextTick(state->interval);
     state->wallTimer =
         _wallTimers.scheduleRepeating(interval, [this, weak = std::weak_ptr<TimerState>(state)] {
             const auto timer = weak.lock();
-            if (timer != nullptr && timer->alive && isSilent()) {
+            if (timer != nullptr && timer->alive && firesByTheWall()) {
                 timer->action();
             }
         });
@@ -80,41 +77,88 @@ std::unique_ptr<RepeatingTimer> SourceClock::scheduleRepeating(std::chrono::nano
     return std::make_unique<Timer>(std::move(state));
 }
 
-void SourceClock::sourceBegan() {
-    _first.reset();
+/// Of a timer that begins now.
+std::optional<Time> SourceClock::nextTick(std::chrono::nanoseconds interval) const {
+    if (_times.isEmpty() || _stretchEnds) {
+        return std::nullopt;
+    }
+    return TimeGrid(_times.first(), interval).nextAfter(*_now);
+}
+
+void SourceClock::sourceBegan(bool isLive) {
+    _isLive = isLive;
+    _hasEnded = false;
+    _stretchEnds = false;
+    _times = {};
 }
 
 bool SourceClock::advance(Time sourceTime) {
-    const Time time = bounded(sourceTime);
+    const Time time = std::clamp(sourceTime, kEarliestTime, kLatestTime);
+    _stamp = time;
     _heard = _steadyNow();
     _timers.remove_if([](const auto& timer) { return timer.expired(); });
-    if (!_first) {
-        _first = time;
-        _now = time;
-        for (const auto& timer : _timers) {
-            const auto state = timer.lock();
-            state->due = TimeGrid(time, state->interval).nextAfter(time);
-        }
+    if (_isLive) {
         return false;
     }
+    _stretchEnds = _times.wouldStepBack(time);
+    if (const auto timer = earliestTimer(_stretchEnds ? Time::max() : time)) {
+        _now = std::max(*_now, *timer->due);
+        timer->due = _stretchEnds
+                         ? std::nullopt
+                         : std::optional(TimeGrid(_times.first(), timer->interval).nextAfter(time));
+        timer->action();
+        return true;
+    }
+    if (_times.isEmpty() || _stretchEnds) {
+        beginStretch(time);
+    }
+    _times.take(time);
+    _now = std::max(*_now, time); // a recording's stamps may step back a little
+    return false;
+}
+
+/// The timer that is due first, of those that are due by `latest`; null when none is.
+std::shared_ptr<SourceClock::TimerState> SourceClock::earliestTimer(Time latest) const {
     std::shared_ptr<TimerState> earliest;
+    if (_times.isEmpty()) {
+        return earliest;
+    }
     for (const auto& timer : _timers) {
         auto state = timer.lock();
-        if (state->alive && *state->due <= time && (!earliest || state->due < earliest->due)) {
+        if (state->alive && state->due && *state->due <= latest &&
+            (!earliest || state->due < earliest->due)) {
             earliest = std::move(state);
         }
     }
-    if (earliest == nullptr) {
-        _now = std::max(*_now, time); // a recording's stamps may step back a little
-        return false;
-    }
-    _now = std::max(*_now, *earliest->due);
-    earliest->due = TimeGrid(*_first, earliest->interval).nextAfter(time);
-    earliest->action();
-    return true;
+    return earliest;
 }
 
+void SourceClock::beginStretch(Time time) {
+    _stretchEnds = false;
+    _now = time;
+    for (const auto& timer : _timers) {
+        const auto state = timer.lock();
+        state->due = TimeGrid(time, state->interval).nextAfter(time);
+    }
+}
+
+void SourceClock::stampRemark(std::uint32_t packet, const StampRemark& remark) {
+    if (_remarked) {
+        _remarked(packet, remark);
+    }
+}
+
+/// A live source's service may go before the timers fire again: they do it now.
 void SourceClock::sourceEnded() {
+    _hasEnded = true;
+    if (_isLive) {
+        const std::vector<std::weak_ptr<TimerState>> timers(_timers.begin(), _timers.end());
+        for (const auto& timer : timers) {
+            if (const auto state = timer.lock(); state != nullptr && state->alive) {
+                state->action();
+            }
+        }
+    }
     if (_ended) {
         const auto callback = _ended; // which may replace itself
         callback();

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/Date.h"
+#include "platform/StampSequence.h"
 
 #include <cstdint>
 
@@ -10,8 +11,9 @@ namespace pallax {
 class SourceTimeListener {
 public:
     virtual ~SourceTimeListener() = default;
-    /// A new connection begins to tell the time; its times need not follow the earlier ones.
-    virtual void sourceBegan() = 0;
+    /// A new connection begins to tell the time; its times need not follow the earlier ones. The
+    /// times of a live source are its stamps, and whatever they do, the present goes on.
+    virtual void sourceBegan(bool isLive) = 0;
     /// One step towards `time`. True: something fell due before it and was done; what that
     /// posted on the main queue comes first, then this is to be called again from a later block.
     /// False: the clock stands at `time`.
@@ -19,6 +21,8 @@ public:
     /// The message that is delivered next is that packet of its source, counted from 1; 0 when
     /// the source does not say.
     virtual void packetNumber(std::uint32_t number) = 0;
+    /// The stamp of the packet with that number is odd; nothing but a sentence need come of it.
+    virtual void stampRemark(std::uint32_t packet, const StampRemark& remark) = 0;
     /// The source has come to its end.
     virtual void sourceEnded() = 0;
 };

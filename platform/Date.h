@@ -13,6 +13,11 @@ using Date = std::chrono::sys_seconds;
 /// A moment as a recording stamps it.
 using Time = std::chrono::sys_time<std::chrono::nanoseconds>;
 
+/// The times that recordings and their sources may have: from the epoch to the year 2255. Within
+/// them no difference, and no sum with a display interval, overflows.
+inline constexpr Time kEarliestTime{};
+inline constexpr Time kLatestTime{std::chrono::seconds(9'000'000'000)};
+
 /// "2023-11-14 22:13:20 +0000": the standard textual description, in UTC.
 std::string dateText(Date date);
 

@@ -21,6 +21,12 @@ std::chrono::nanoseconds scaled(std::chrono::nanoseconds time, double factor) {
         std::llround(std::clamp(static_cast<double>(time.count()) * factor, 0.0, kLongest)));
 }
 
+/// Within the times that a source may have, whatever a recording that is played in a loop holds.
+Time shifted(Time time, std::chrono::nanoseconds shift) {
+    const bool forward = shift > std::chrono::nanoseconds::zero();
+    return std::max((forward ? std::min(time, kLatestTime - shift) : time) + shift, kEarliestTime);
+}
+
 } // namespace
 
 PacketPlayer::PacketPlayer(Setup setup)
@@ -75,17 +81,32 @@ PacketPlayer::Progress PacketPlayer::fetch() {
     }
     _packet = next.packet;
     ++_packetNumber;
-    if (!_first) {
-        _first = _last = _packet->time;
-        _started = _setup.steadyNow();
-        writeClock(*_first);
-    } else if (_newRound) {
+    if (_newRound && !_stamps.isEmpty()) {
         _shift = nextTick() - _packet->time;
     }
     _newRound = false;
-    _packet->time += _shift;
-    _last = std::max(_last, _packet->time);
+    _packet->time = shifted(_packet->time, _shift);
+    followStamp();
     return Progress::Go;
+}
+
+/// Takes the next packet's stamp. A receiver that is not sent the packet is to hear of it too.
+void PacketPlayer::followStamp() {
+    const bool isFirst = _stamps.isEmpty();
+    if (!_setup.options.live) {
+        if (_packet->isOutOfRange && !std::exchange(_toldOutOfRange, true)) {
+            writeRemark({StampRemark::Kind::OutOfRange, {}});
+        }
+        if (const auto step = _stamps.stepTo(_packet->time)) {
+            writeRemark(*step);
+        }
+    }
+    const bool beginsStretch = isFirst || _stamps.wouldStepBack(_packet->time);
+    _stamps.take(_packet->time);
+    if (beginsStretch) {
+        _started = _setup.steadyNow();
+        writeClock(_packet->time);
+    }
 }
 
 /// After the source's end: begins again where that is asked for and possible.
@@ -100,8 +121,7 @@ PacketPlayer::Progress PacketPlayer::startRound() {
 
 void PacketPlayer::sendPacket() {
     if (_filter->wants(_packet->data)) {
-        FrameHeader header;
-        header.sourceTime = _packet->time;
+        FrameHeader header = headerOf(FrameKind::Message, _packet->time);
         header.number = _packetNumber;
         _setup.sink.write(header, _packet->data);
     }
@@ -128,15 +148,13 @@ PacketPlayer::Progress PacketPlayer::waitUntilDue(Time time) {
 
 /// After the last packet of all: the clock goes on to the next display tick.
 void PacketPlayer::finish() {
-    if (_first) {
+    if (!_stamps.isEmpty()) {
         if (waitUntilDue(nextTick()) == Progress::Wait) {
             return;
         }
         writeClock(nextTick());
     }
-    FrameHeader end;
-    end.kind = FrameKind::End;
-    _setup.sink.write(end, {});
+    _setup.sink.write(headerOf(FrameKind::End, std::nullopt), {});
     flushThen(&PacketPlayer::tellEnd);
 }
 
@@ -150,7 +168,8 @@ void PacketPlayer::tellEnd() {
 void PacketPlayer::tellRunningTime() {
     const auto elapsed = _setup.steadyNow() - _started;
     const Time limit = _packet ? _packet->time : nextTick();
-    writeClock(std::min(*_first + scaled(elapsed, _setup.options.speed), limit));
+    const auto played = scaled(elapsed, _setup.options.speed);
+    writeClock(_stamps.first() + std::min(played, limit - _stamps.first()));
     flushThen(&PacketPlayer::step);
 }
 
@@ -158,21 +177,36 @@ void PacketPlayer::flushThen(void (PacketPlayer::*next)()) {
     _setup.sink.flush(guarded(next));
 }
 
-void PacketPlayer::writeClock(Time time) {
+FrameHeader PacketPlayer::headerOf(FrameKind kind, std::optional<Time> time) const {
     FrameHeader header;
-    header.kind = FrameKind::Clock;
+    header.kind = kind;
     header.sourceTime = time;
-    _setup.sink.write(header, {});
+    header.isLive = _setup.options.live;
+    return header;
+}
+
+void PacketPlayer::writeClock(Time time) {
+    _setup.sink.write(headerOf(FrameKind::Clock, time), {});
+}
+
+/// On the packet that comes next; the time is the latest before it.
+void PacketPlayer::writeRemark(const StampRemark& remark) {
+    FrameHeader header = headerOf(FrameKind::Remark, std::nullopt);
+    if (!_stamps.isEmpty()) {
+        header.sourceTime = _stamps.latest();
+    }
+    header.number = _packetNumber;
+    _setup.sink.write(header, encodeRemark(remark));
 }
 
 std::chrono::nanoseconds PacketPlayer::wallDelayUntil(Time time) const {
-    const auto wall = scaled(time - *_first, 1.0 / _setup.options.speed);
+    const auto wall = scaled(time - _stamps.first(), 1.0 / _setup.options.speed);
     return wall - (_setup.steadyNow() - _started);
 }
 
-/// The first display tick after the last packet.
+/// The first display tick after the latest packet.
 Time PacketPlayer::nextTick() const {
-    return TimeGrid(*_first, _setup.options.displayInterval).nextAfter(_last);
+    return TimeGrid(_stamps.first(), _setup.options.displayInterval).nextAfter(_stamps.latest());
 }
 
 std::function<void()> PacketPlayer::guarded(void (PacketPlayer::*member)()) {

@@ -1,6 +1,8 @@
 #pragma once
 
+#include "host/PortFrame.h"
 #include "platform/Date.h"
+#include "platform/StampSequence.h"
 #include "telephony/CodeFilter.h"
 #include "telephony/PacketSource.h"
 
@@ -23,6 +25,8 @@ struct PlayOptions {
     bool loop = false;  ///< begins again at the end, with ever later source times
     /// The receiver's display ticks, which a last clock frame is to reach.
     std::chrono::nanoseconds displayInterval = std::chrono::seconds(2);
+    /// The source is a live stream, whose stamps set neither the pace nor the receiver's ticks.
+    bool live = false;
 };
 
 /// Plays a source into a sink with the source's own timing. The player drops nothing: one chunk is
@@ -30,7 +34,9 @@ struct PlayOptions {
 ///
 /// Every packet goes with its source time. The first packet's time goes ahead of all, even when
 /// that packet is not wanted; while nothing is due, the running time goes at least every half
-/// second; after the last packet comes the time of the next display tick, then End.
+/// second; after the last packet comes the time of the next display tick, then End. Where the
+/// stamps step back, playing goes on at once from there. Odd stamps are remarked on, ahead of their
+/// packets, wanted or not.
 class PacketPlayer {
 public:
     using SteadyNow = std::function<std::chrono::steady_clock::time_point()>;
@@ -59,12 +65,15 @@ private:
     Progress fetch();
     Progress waitUntilDue(Time time);
     Progress startRound();
+    void followStamp();
     void sendPacket();
     void finish();
     void flushThen(void (PacketPlayer::*next)());
     void tellEnd();
     void tellRunningTime();
+    FrameHeader headerOf(FrameKind kind, std::optional<Time> time) const;
     void writeClock(Time time);
+    void writeRemark(const StampRemark& remark);
     std::chrono::nanoseconds wallDelayUntil(Time time) const;
     Time nextTick() const;
     std::function<void()> guarded(void (PacketPlayer::*member)());
@@ -73,13 +82,13 @@ private:
     std::optional<CodeFilter> _filter;
     std::optional<PacketSource::Packet> _packet; // fetched, not yet sent; its time is shifted
     std::uint32_t _packetNumber = 0;             // of that packet in the source, from 1
-    std::optional<Time> _first;                  // source time of the very first packet
-    Time _last;                                  // the latest source time of a packet
+    StampSequence _stamps;                       // of the packets, shifted
     std::chrono::nanoseconds _shift{0};          // of this round's stamps
     bool _newRound = true;
+    bool _toldOutOfRange = false;
     bool _sourceEnded = false;
-    std::chrono::steady_clock::time_point _started;
-    std::shared_ptr<PacketPlayer*> _alive; // blocks hold it weakly
+    std::chrono::steady_clock::time_point _started; // the present stretch of stamps
+    std::shared_ptr<PacketPlayer*> _alive;          // blocks hold it weakly
 };
 
 } // namespace pallax

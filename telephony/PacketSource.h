@@ -19,6 +19,8 @@ public:
     struct Packet {
         Time time;
         Bytes data; ///< valid until the next call
+        /// See RecordedPacket.
+        bool isOutOfRange = false;
     };
     enum class State {
         Packet, ///< `packet` is set

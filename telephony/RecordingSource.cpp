@@ -31,7 +31,7 @@ PacketSource::Next RecordingSource::next() {
     if (!packet) {
         return {State::End, std::nullopt};
     }
-    return {State::Packet, Packet{packet->time, packet->data}};
+    return {State::Packet, Packet{packet->time, packet->data, packet->isOutOfRange}};
 }
 
 void RecordingSource::whenReady(std::function<void()> ready) {

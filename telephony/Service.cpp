@@ -100,6 +100,7 @@ TelephonyServer::Setup serverSetup(const ServiceOptions& options, AsioMainQueue&
     setup.technology = program.technology;
     if (options.relay) {
         setup.options.speed = PlayOptions::kAsFastAsTaken; // the stream has its own pace
+        setup.options.live = true;
     }
     const bool clientSetsPace = std::isinf(options.play.speed) && !options.relay;
     if (!options.lossless && !clientSetsPace) {

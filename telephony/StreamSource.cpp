@@ -14,6 +14,7 @@ struct StreamSource::Shared {
     struct Item {
         Time time;
         ByteBuffer data;
+        bool isOutOfRange;
     };
 
     explicit Shared(MainQueue& mainQueue) : queue(mainQueue) {}
@@ -51,7 +52,8 @@ void StreamSource::Shared::read(Recording& recording, const std::shared_ptr<Shar
         const auto packet = recording.next();
         std::unique_lock lock(mutex);
         if (packet) {
-            items.push_back({packet->time, ByteBuffer(packet->data.begin(), packet->data.end())});
+            items.push_back({packet->time, ByteBuffer(packet->data.begin(), packet->data.end()),
+                             packet->isOutOfRange});
         } else {
             ended = true;
             failure = recording.error() ? recording.error()->sentence : std::string();
@@ -91,7 +93,7 @@ PacketSource::Next StreamSource::next() {
     _shared->items.pop_front();
     _shared->room.notify_one();
     _current = std::move(item.data);
-    return {State::Packet, Packet{item.time, _current}};
+    return {State::Packet, Packet{item.time, _current, item.isOutOfRange}};
 }
 
 void StreamSource::whenReady(std::function<void()> ready) {

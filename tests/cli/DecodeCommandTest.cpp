@@ -110,8 +110,49 @@ TEST_F(DecodeCommandTest, EveryModeGeneratesTheDisplayAtTheTicksOfTheRecording) 
         EXPECT_EQ(ScriptedGenerator::generations,
                   (std::vector<ScriptedGenerator::Generated>{
                       {kFirstPacket + seconds(2), 6},
-                      {kFirstPacket + hours(24 * 365 * 30) + seconds(2), 6}}));
+                      {kFirstPacket + hours(24 * 365 * 30) + seconds(2), 3},
+                      {kFirstPacket + milliseconds(2050), 3}}));
     }
+}
+
+TEST_F(DecodeCommandTest, WhereStampsStepBackTicksAreCountedAnewAndTheirNumbersGoOn) {
+    options.every = Every::Tick;
+    add("a.pcap", {{seconds(0), "A=1"},
+                   {seconds(3), "A=2"},
+                   {seconds(-3600), "A=3"},
+                   {milliseconds(-3'598'001), "A=4"},
+                   {milliseconds(-3'598'000), "A=5"}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written,
+              R"({"tick":1,"time":"2023-11-14T22:13:22.000Z","display":{"Cell":{"A":"1"}}})"
+              "\n"
+              R"({"tick":2,"time":"2023-11-14T22:13:24.000Z","display":{"Cell":{"A":"2"}}})"
+              "\n"
+              R"({"tick":3,"time":"2023-11-14T21:13:22.000Z","display":{"Cell":{"A":"4"}}})"
+              "\n"
+              R"({"tick":4,"time":"2023-11-14T21:13:24.000Z","display":{"Cell":{"A":"5"}}})"
+              "\n");
+    EXPECT_EQ(reports, std::vector<std::string>{
+                           "a.pcap: packet 3 is 3603.0 s earlier than the latest packet before it; "
+                           "ticks are counted anew from there."});
+}
+
+TEST_F(DecodeCommandTest, AGapIsToldOnceForEachRecording) {
+    for (const char* name : {"a.pcap", "b.pcap"}) {
+        add(name, {{seconds(0), "A=1"}, {seconds(60), "A=2"}, {milliseconds(120'100), "A=3"}});
+    }
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(reports,
+              (std::vector<std::string>{"a.pcap: no packets for 60.1 s before packet 3.",
+                                        "b.pcap: no packets for 60.1 s before packet 3."}));
+}
+
+TEST_F(DecodeCommandTest, OfStampsOutOfRangeTheFirstIsTold) {
+    add("a.pcap", {{seconds(0), "A=1"}, {seconds(1), "A=2", true}, {seconds(2), "A=3", true}});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(reports, std::vector<std::string>{
+                           "a.pcap: the stamp of packet 2 is no time from 1970 to 2255; the "
+                           "nearest one is taken for it and for others like it."});
 }
 
 TEST_F(DecodeCommandTest, AStretchWithoutTicksDoesNotGrowWithoutBound) {

@@ -19,7 +19,7 @@ namespace pallax::doubles {
 
 namespace {
 
-constexpr std::chrono::seconds kPatience{30};
+constexpr std::chrono::seconds kScreenPatience{30};
 
 winsize sizeOf(int columns, int rows) {
     winsize size{};
@@ -88,7 +88,7 @@ bool PallaxTerminal::readFor(int milliseconds) {
 }
 
 bool PallaxTerminal::waitUntil(const std::function<bool()>& condition, const std::string& wanted) {
-    const auto end = std::chrono::steady_clock::now() + kPatience;
+    const auto end = std::chrono::steady_clock::now() + kScreenPatience;
     while (!condition()) {
         if (std::chrono::steady_clock::now() > end || (!readFor(20) && _isClosed)) {
             ADD_FAILURE() << "waited for " << wanted << "; the screen:\n" << _screen.text();
@@ -116,7 +116,7 @@ std::string PallaxTerminal::settled() {
 }
 
 int PallaxTerminal::wait() {
-    const auto end = std::chrono::steady_clock::now() + kPatience;
+    const auto end = std::chrono::steady_clock::now() + kScreenPatience;
     int status = 0;
     while (::waitpid(_process, &status, WNOHANG) == 0) {
         (void)readFor(20);

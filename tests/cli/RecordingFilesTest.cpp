@@ -96,6 +96,29 @@ TEST_F(RecordingFilesTest, TheNextFileBeginsSoManySecondsOfPacketTimeAfterTheFir
     EXPECT_EQ(packetsIn("a-0003.pcapng"), 1);
 }
 
+TEST_F(RecordingFilesTest, WhereStampsStepBackTheTimeBeforeCountsToo) {
+    auto options = optionsFor("a.pcapng");
+    options.rotateAfter = seconds(10);
+    const auto files = RecordingFiles::open(options);
+    for (const int second : {0, 6, -3600, -3597, -3596, -3595}) {
+        ASSERT_EQ(add(**files, seconds(second)), std::nullopt);
+    }
+    EXPECT_EQ(packetsIn("a-0001.pcapng"), 4);
+    EXPECT_EQ(packetsIn("a-0002.pcapng"), 2);
+}
+
+TEST_F(RecordingFilesTest, AfterOneStampThatIsAheadFilesAreAsLongAsBefore) {
+    auto options = optionsFor("a.pcapng");
+    options.rotateAfter = seconds(10);
+    const auto files = RecordingFiles::open(options);
+    for (const int second : {0, 1, 3600, 2, 3, 11, 12, 13}) {
+        ASSERT_EQ(add(**files, seconds(second)), std::nullopt);
+    }
+    EXPECT_EQ(packetsIn("a-0001.pcapng"), 2);
+    EXPECT_EQ(packetsIn("a-0002.pcapng"), 4);
+    EXPECT_EQ(packetsIn("a-0003.pcapng"), 2);
+}
+
 TEST_F(RecordingFilesTest, ANumberThatIsTakenIsRefusedAtFirstAndPassedOverLater) {
     auto options = optionsFor("a.pcapng");
     options.rotateSize = 1;

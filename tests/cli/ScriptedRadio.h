@@ -83,6 +83,7 @@ public:
     struct Packet {
         std::chrono::milliseconds sinceFirst;
         std::string text;
+        bool isOutOfRange = false;
     };
 
     ScriptedRecording(std::string name, std::vector<Packet> packets,
@@ -104,7 +105,7 @@ public:
         }
         const Packet& packet = _packets[_next++];
         _bytes.assign(packet.text.begin(), packet.text.end());
-        return RecordedPacket{kFirstPacket + packet.sinceFirst, _bytes};
+        return RecordedPacket{kFirstPacket + packet.sinceFirst, _bytes, packet.isOutOfRange};
     }
     const std::optional<RecordingError>& error() const override { return _error; }
 

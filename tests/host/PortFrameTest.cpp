@@ -44,11 +44,12 @@ std::string faultWith(std::size_t offset, std::uint8_t value) {
 TEST(PortFrame, AHeaderIsLaidOutAsDocumented) {
     FrameHeader header = headerOf(FrameKind::Request, -2);
     header.number = 0x01020304;
+    header.isLive = true;
     header.sourceTime = Time(std::chrono::nanoseconds(0x1122334455667788));
     const std::array<std::uint8_t, kFrameHeaderSize> expected = {
         'P',  'L',  'X',  'M',                          // magic
         2,    0,                                        // kind
-        0,    0,                                        // reserved
+        1,    0,                                        // flags
         0xFE, 0xFF, 0xFF, 0xFF,                         // identifier
         5,    1,    0,    0,                            // length, 261
         0x88, 0x77, 0x66, 0x55, 0x44, 0x33, 0x22, 0x11, // source time
@@ -95,9 +96,11 @@ TEST(PortFrame, WhatIsNoFrameIsAFault) {
     EXPECT_EQ(faultWith(0, 'p'), "no frame where one should begin");
     EXPECT_EQ(faultWith(3, 'L'), "no frame where one should begin");
     EXPECT_EQ(faultWith(4, 0), "an unknown kind of frame");
-    EXPECT_EQ(faultWith(4, 7), "an unknown kind of frame");
+    EXPECT_EQ(faultWith(4, 8), "an unknown kind of frame");
     EXPECT_EQ(faultWith(5, 1), "an unknown kind of frame");
-    EXPECT_EQ(faultWith(6, 1), "a reserved field that is not zero");
+    EXPECT_EQ(faultWith(6, 1), "");
+    EXPECT_EQ(faultWith(6, 2), "an unknown flag");
+    EXPECT_EQ(faultWith(7, 1), "an unknown flag");
     EXPECT_EQ(faultWith(31, 1), "a reserved field that is not zero");
     EXPECT_EQ(faultWith(15, 2), "a message of more than 16 MiB");
     EXPECT_EQ(faultWith(4, 1), "");
@@ -120,6 +123,27 @@ TEST(PortFrame, AClockOrEndWithDataIsAFault) {
     }
 }
 
+TEST(PortFrame, ARemarkIsLaidOutAsDocumented) {
+    const StampRemark gap{StampRemark::Kind::Gap, std::chrono::nanoseconds(0x0102030405060708)};
+    EXPECT_EQ(encodeRemark(gap), (ByteBuffer{2, 0, 0, 0, 8, 7, 6, 5, 4, 3, 2, 1}));
+    EXPECT_EQ(decodeRemark(encodeRemark(gap)), gap);
+}
+
+TEST(PortFrame, OtherDataAreNoRemark) {
+    ByteBuffer data = encodeRemark({StampRemark::Kind::OutOfRange, {}});
+    EXPECT_TRUE(decodeRemark(data));
+    data[0] = 0;
+    EXPECT_EQ(decodeRemark(data), std::nullopt);
+    data[0] = 4;
+    EXPECT_EQ(decodeRemark(data), std::nullopt);
+    data[0] = 1;
+    data.back() = 0x80; // a size below zero
+    EXPECT_EQ(decodeRemark(data), std::nullopt);
+    data.pop_back();
+    EXPECT_EQ(decodeRemark(data), std::nullopt);
+    EXPECT_EQ(decodeRemark({}), std::nullopt);
+}
+
 TEST(PortFrame, AfterAFaultNothingIsTaken) {
     PortFrameParser parser;
     const ByteBuffer garbage(kFrameHeaderSize, 0xAA);
@@ -134,6 +158,7 @@ TEST(PortFrame, WhateverIsFramedIsParsedAgain) {
         std::vector<PortFrame> expected;
         for (const ByteBuffer& message : messages) {
             FrameHeader header = headerOf(FrameKind::Message, identifier);
+            header.isLive = *rc::gen::arbitrary<bool>();
             header.sourceTime = Time(std::chrono::nanoseconds(
                 *rc::gen::inRange<std::int64_t>(std::numeric_limits<std::int64_t>::min() + 1,
                                                 std::numeric_limits<std::int64_t>::max())));

@@ -138,6 +138,38 @@ TEST_F(RecordingTest, PcapngIsReadInBothResolutions) {
     }
 }
 
+TEST_F(RecordingTest, SecondsOfPcapHaveNoSign) {
+    for (const std::uint32_t second : {0x7FFFFFFFU, 0x80000000U, 0xFFFFFFFFU}) {
+        std::string content = pcap(kNanoseconds);
+        content.replace(kPcapHeader, 4, CaptureBytes().u32(second).bytes());
+        const auto recording = open(content);
+        const auto packet = recording->next();
+        ASSERT_TRUE(packet);
+        EXPECT_EQ(packet->time, Time(std::chrono::seconds(second) + std::chrono::nanoseconds(7)));
+        EXPECT_FALSE(packet->isOutOfRange);
+    }
+}
+
+TEST_F(RecordingTest, AStampThatIsNoTimeIsTakenForTheNearestAndMarked) {
+    constexpr unsigned kSeconds = 0;
+    const auto timeOf = [this](const std::string& content) {
+        const auto recording = open(content);
+        const auto packet = recording->next();
+        EXPECT_TRUE(packet && packet->isOutOfRange);
+        return packet ? packet->time : Time();
+    };
+    EXPECT_EQ(timeOf(pcapng(kSeconds, 9'000'000'000)), kLatestTime);
+    EXPECT_EQ(timeOf(pcapng(kSeconds, 0xFFFFFFFFFFFFFFFF)), kEarliestTime);
+    std::string content = pcap(kNanoseconds);
+    content.replace(kPcapHeader + 4, 4, CaptureBytes().u32(1'000'000'000).bytes());
+    EXPECT_EQ(timeOf(content), Time(std::chrono::nanoseconds(1700000000'999999999)));
+    const auto whole = open(pcapng(kSeconds, 8'999'999'999));
+    const auto latest = whole->next();
+    ASSERT_TRUE(latest);
+    EXPECT_EQ(latest->time, kLatestTime - std::chrono::seconds(1));
+    EXPECT_FALSE(latest->isOutOfRange);
+}
+
 TEST_F(RecordingTest, APcapCutInAPacketGivesThePacketsBeforeAndSaysSo) {
     const std::string whole = pcap(kMicroseconds);
     for (std::size_t length = kPcapHeader; length <= whole.size(); ++length) {

@@ -272,7 +272,7 @@ TEST_F(SocketLocalPortTest, ASlowReceiverStopsTheSenderAndNothingIsBuffered) {
 
 class Diary final : public SourceTimeListener {
 public:
-    void sourceBegan() override { lines.emplace_back("began"); }
+    void sourceBegan(bool isLive) override { lines.emplace_back(isLive ? "began live" : "began"); }
     bool advance(Time time) override {
         lines.push_back("advance " + std::to_string(time.time_since_epoch().count()));
         if (steps == 0) {
@@ -283,6 +283,10 @@ public:
         return true;
     }
     void packetNumber(std::uint32_t number) override { numbers.push_back(number); }
+    void stampRemark(std::uint32_t packet, const StampRemark& remark) override {
+        lines.push_back("remark on " + std::to_string(packet) + ": " +
+                        std::to_string(remark.size.count()));
+    }
     void sourceEnded() override { lines.emplace_back("ended"); }
 
     std::vector<std::string> lines;
@@ -323,6 +327,41 @@ TEST_F(SocketLocalPortTest, SourceTimesAreToldBeforeTheMessageAndTicksPrecedeIt)
               (std::vector<std::string>{"began", "advance 5", "posted by a tick", "advance 5",
                                         "message a", "message b", "advance 9", "ended"}));
     EXPECT_EQ(diary.numbers, (std::vector<std::uint32_t>{17, 0}));
+}
+
+TEST_F(SocketLocalPortTest, ALiveSourceAndRemarksAreTold) {
+    Diary diary;
+    SocketMessagePorts ports(_queue, openDirectory(), &diary);
+    auto local = ports.createLocal("a.port", [](std::int32_t, Bytes) { return std::nullopt; });
+    local.port->setDispatchQueue(_queue);
+    ByteBuffer stream;
+    FrameHeader header;
+    header.kind = FrameKind::Remark;
+    header.isLive = true;
+    header.number = 18;
+    header.sourceTime = Time(std::chrono::nanoseconds(5));
+    appendFrame(stream, header,
+                encodeRemark({StampRemark::Kind::Gap, std::chrono::nanoseconds(70)}));
+    const Descriptor raw = connectTo(socketPath("a.port"));
+    (void)sendTo(raw, stream);
+    EXPECT_TRUE(runUntil(_queue, [&] { return diary.lines.size() == 3; }));
+    EXPECT_EQ(diary.lines,
+              (std::vector<std::string>{"began live", "advance 5", "remark on 18: 70"}));
+}
+
+TEST_F(SocketLocalPortTest, APeerWhoseRemarkIsNoneIsCutOff) {
+    SocketMessagePorts ports(_queue, openDirectory());
+    auto local = ports.createLocal("a.port", [](std::int32_t, Bytes) { return std::nullopt; });
+    local.port->setDispatchQueue(_queue);
+    FrameHeader header;
+    header.kind = FrameKind::Remark;
+    ByteBuffer stream;
+    appendFrame(stream, header, bytesOf("what remark?"));
+    const Descriptor raw = connectTo(socketPath("a.port"));
+    (void)sendTo(raw, stream);
+    std::array<std::uint8_t, 1> nothing{};
+    EXPECT_TRUE(runUntil(
+        _queue, [&] { return receiveFrom(raw, nothing).state == Transfer::State::Closed; }));
 }
 
 } // namespace

@@ -17,7 +17,7 @@ using namespace std::chrono_literals;
 class SourceClockTest : public testing::Test {
 protected:
     static Time at(std::chrono::nanoseconds sinceStart) {
-        return Time(std::chrono::seconds(1000)) + sinceStart;
+        return Time(std::chrono::seconds(1'000'000)) + sinceStart;
     }
     /// Advances as a port does: step by step until the time is reached.
     void reach(std::chrono::nanoseconds sinceStart) {
@@ -141,7 +141,7 @@ TEST_F(SourceClockTest, ATimerMayEndItselfInItsAction) {
 TEST_F(SourceClockTest, ANewConnectionBeginsAGridOfItsOwn) {
     const auto timer = tick(2s);
     reach(100s);
-    _clock.sourceBegan();
+    _clock.sourceBegan(false);
     reach(1s);
     EXPECT_EQ(_clock.now(), at(1s));
     reach(3s);
@@ -170,10 +170,127 @@ TEST_F(SourceClockTest, AfterTwoSecondsOfSilenceTheWallClockTakesOver) {
     _queue.advance(1999ms);
     EXPECT_EQ(_ticks.size(), 0U);
     _queue.advance(1001ms); // 4 s: silent for 3 s
-    EXPECT_EQ(_ticks, (Ticks{0s}));
+    EXPECT_EQ(_ticks, (Ticks{3s}));
     reach(1s);
     _queue.advance(1900ms);
     EXPECT_EQ(_ticks.size(), 1U);
+}
+
+TEST_F(SourceClockTest, InAPauseOfTheSourceTheClockRunsOnAndAfterItsEndItStands) {
+    reach(10s);
+    _queue.advance(2s);
+    EXPECT_EQ(_clock.now(), at(10s));
+    _queue.advance(3s);
+    EXPECT_EQ(_clock.now(), at(15s));
+    reach(11s);
+    EXPECT_EQ(_clock.now(), at(11s));
+    _clock.sourceEnded();
+    _queue.advance(1h);
+    EXPECT_EQ(_clock.now(), at(11s));
+    _clock.sourceBegan(false);
+    reach(0s);
+    _queue.advance(5s);
+    EXPECT_EQ(_clock.now(), at(5s));
+}
+
+TEST_F(SourceClockTest, AStepBackGivesTheLastTickAndAGridThatBeginsThere) {
+    const auto timer = tick(2s);
+    reach(0s);
+    reach(5s);
+    reach(-3600s);
+    EXPECT_EQ(_ticks, (Ticks{2s, 6s}));
+    EXPECT_EQ(_clock.now(), at(-3600s));
+    reach(-3598001ms);
+    EXPECT_EQ(_ticks, (Ticks{2s, 6s}));
+    reach(-3598s);
+    EXPECT_EQ(_ticks, (Ticks{2s, 6s, -3598s}));
+}
+
+TEST_F(SourceClockTest, AtAStepBackEachTimerTicksOnceInTheOrderOfTheirTimes) {
+    std::vector<int> order;
+    const auto slow = _clock.scheduleRepeating(3s, [&] { order.push_back(3); });
+    const auto quick = _clock.scheduleRepeating(2s, [&] { order.push_back(2); });
+    reach(10s);
+    EXPECT_TRUE(_clock.advance(at(0s)));
+    EXPECT_EQ(_clock.now(), at(12s));
+    EXPECT_TRUE(_clock.advance(at(0s)));
+    EXPECT_EQ(_clock.now(), at(13s));
+    EXPECT_FALSE(_clock.advance(at(0s)));
+    EXPECT_EQ(order, (std::vector<int>{2, 3}));
+}
+
+TEST_F(SourceClockTest, ATimerThatIsScheduledByALastTickBelongsToTheNextStretch) {
+    int ticks = 0;
+    std::unique_ptr<RepeatingTimer> other;
+    const auto timer = _clock.scheduleRepeating(2s, [&] {
+        ++ticks;
+        other = tick(2s);
+    });
+    reach(10s);
+    reach(0s);
+    EXPECT_EQ(ticks, 1);
+    EXPECT_EQ(_ticks, Ticks{});
+    reach(2s);
+    EXPECT_EQ(ticks, 2);
+}
+
+TEST_F(SourceClockTest, ALiveSourcesStampsMoveNeitherClockNorTimers) {
+    const auto timer = tick(2s);
+    _clock.sourceBegan(true);
+    for (const auto stamp : {0s, 3600s, -3600s, -3600s, 7200s, 0s}) {
+        reach(stamp);
+        EXPECT_EQ(_clock.now(), _wall.now());
+        EXPECT_EQ(_clock.stamp(), at(stamp));
+    }
+    EXPECT_EQ(_ticks, Ticks{});
+    for (int step = 0; step < 20; ++step) { // ten seconds
+        _wall.advance(500ms);
+        _queue.advance(500ms);
+        reach(-3600s); // a clock that was set back, and stands
+    }
+    EXPECT_EQ(_ticks.size(), 5U);
+    _wall.advance(5s); // a pause
+    EXPECT_EQ(_clock.now(), doubles::ManualClock::kStart + 15s);
+}
+
+TEST_F(SourceClockTest, TheEndOfALiveSourceIsATick) {
+    const auto timer = tick(2s);
+    const auto gone = tick(2s);
+    gone->invalidate();
+    _clock.sourceBegan(true);
+    reach(0s);
+    _clock.sourceEnded();
+    EXPECT_EQ(_ticks.size(), 1U);
+}
+
+TEST_F(SourceClockTest, AfterALiveSourceAPlayedOneTellsTheTimeAgain) {
+    const auto timer = tick(2s);
+    _clock.sourceBegan(true);
+    reach(100s);
+    _clock.sourceBegan(false);
+    reach(0s);
+    reach(3s);
+    EXPECT_EQ(_clock.now(), at(3s));
+    EXPECT_EQ(_ticks, (Ticks{2s}));
+}
+
+TEST_F(SourceClockTest, AStampIsToldAsItIs) {
+    EXPECT_EQ(_clock.stamp(), doubles::ManualClock::kStart);
+    reach(10s);
+    reach(9s);
+    EXPECT_EQ(_clock.now(), at(10s));
+    EXPECT_EQ(_clock.stamp(), at(9s));
+}
+
+TEST_F(SourceClockTest, RemarksOnStampsAreHandedOn) {
+    const StampRemark gap{StampRemark::Kind::Gap, 61s};
+    _clock.stampRemark(1, gap); // nobody listens
+    std::vector<std::pair<std::uint32_t, StampRemark>> told;
+    _clock.onStampRemark([&](std::uint32_t packet, const StampRemark& remark) {
+        told.emplace_back(packet, remark);
+    });
+    _clock.stampRemark(18, gap);
+    EXPECT_EQ(told, (std::vector<std::pair<std::uint32_t, StampRemark>>{{18, gap}}));
 }
 
 TEST_F(SourceClockTest, TellsTheEndOfTheSource) {
@@ -192,7 +309,8 @@ TEST_F(SourceClockTest, TimesAtTheEdgeOfTheRangeOverflowNothing) {
         while (_clock.advance(edge(count))) {
         }
     }
-    EXPECT_EQ(_clock.now(), edge(std::int64_t{1} << 62U));
+    EXPECT_EQ(_clock.now(), kLatestTime);
+    EXPECT_EQ(_clock.stamp(), kLatestTime);
     EXPECT_EQ(_ticks.size(), 1U);
 }
 

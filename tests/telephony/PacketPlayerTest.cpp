@@ -11,7 +11,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-constexpr std::chrono::seconds kFirst{1000}; // the first packet's stamp
+constexpr std::chrono::seconds kFirst{1'000'000}; // the first packet's stamp
 
 /// Packets with a log code and no more, stamped in milliseconds after kFirst.
 class ListSource final : public PacketSource {
@@ -19,6 +19,7 @@ public:
     struct Item {
         std::chrono::milliseconds time;
         std::uint8_t code;
+        bool isOutOfRange = false;
     };
     explicit ListSource(std::vector<Item> items) : _items(std::move(items)) {}
 
@@ -32,7 +33,7 @@ public:
         }
         const Item& item = _items[_next++];
         _data = {1, 0, 0, item.code, 0};
-        return {State::Packet, Packet{Time(kFirst + item.time), _data}};
+        return {State::Packet, Packet{Time(kFirst + item.time), _data, item.isOutOfRange}};
     }
     void whenReady(std::function<void()> callback) override { ready = std::move(callback); }
     bool restart() override {
@@ -64,9 +65,11 @@ public:
             return std::to_string(time.count() / 1'000'000);
         };
         std::string line = ms(_queue.now()) + ": ";
-        line += header.kind == FrameKind::Message ? "packet " + std::to_string(data[3])
-                : header.kind == FrameKind::Clock ? "clock"
-                                                  : "end";
+        line += header.kind == FrameKind::Message  ? "packet " + std::to_string(data[3])
+                : header.kind == FrameKind::Clock  ? "clock"
+                : header.kind == FrameKind::Remark ? remarkText(header.number, data)
+                                                   : "end";
+        line += header.isLive ? " live" : "";
         if (header.sourceTime) {
             line += " at " + ms(header.sourceTime->time_since_epoch() - kFirst);
         }
@@ -88,6 +91,14 @@ public:
     std::function<void()> held;
 
 private:
+    static std::string remarkText(std::uint32_t packet, Bytes data) {
+        const auto remark = decodeRemark(data);
+        constexpr const char* kKinds[] = {"none", "back", "gap", "out of range"};
+        return kKinds[remark ? static_cast<int>(remark->kind) : 0] + std::string(" ") +
+               std::to_string(remark ? remark->size.count() / 1'000'000 : 0) + " at packet no. " +
+               std::to_string(packet);
+    }
+
     doubles::SteppedQueue& _queue;
     std::size_t _pending = 0;
 };
@@ -147,8 +158,9 @@ TEST_F(PacketPlayerTest, AtHalfSpeedTheClockRunsHalfAsFast) {
 TEST_F(PacketPlayerTest, AsFastAsTakenWaitsForNothing) {
     play({{0ms, 1}, {3'000'000ms, 2}}, at(PlayOptions::kAsFastAsTaken));
     _queue.runReady();
-    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0", "0: packet 2 at 3000000",
-                                  "0: clock at 3002000", "0: end"}));
+    EXPECT_EQ(_sink.diary,
+              (Diary{"0: clock at 0", "0: packet 1 at 0", "0: gap 3000000 at packet no. 2 at 0",
+                     "0: packet 2 at 3000000", "0: clock at 3002000", "0: end"}));
 }
 
 TEST_F(PacketPlayerTest, TheTickAfterTheLastPacketLiesOnTheGridOfTheFirst) {
@@ -235,6 +247,74 @@ TEST_F(PacketPlayerTest, ASourceWithNothingYetIsWaitedFor) {
     _source->holdBackAt = ListSource::kNever;
     _source->ready();
     EXPECT_EQ(_sink.diary.back(), "1000: packet 2 at 100"); // late: at once
+}
+
+TEST_F(PacketPlayerTest, AfterAStepBackItGoesOnAtOnceFromThere) {
+    play({{0ms, 1}, {3000ms, 2}, {-3'600'000ms, 3}, {-3'599'600ms, 4}}, at(10));
+    _queue.advance(1s);
+    EXPECT_EQ(_sink.diary,
+              (Diary{"0: clock at 0", "0: packet 1 at 0", "300: packet 2 at 3000",
+                     "300: back 3603000 at packet no. 3 at 3000", "300: clock at -3600000",
+                     "300: packet 3 at -3600000", "340: packet 4 at -3599600",
+                     "500: clock at -3598000", "500: end"}));
+}
+
+TEST_F(PacketPlayerTest, AStepBackIsToldAlsoToWhoDoesNotWantThePacket) {
+    _source.emplace(std::vector<ListSource::Item>{{0ms, 1}, {9000ms, 2}, {5000ms, 3}, {5001ms, 1}});
+    _player.emplace(
+        PacketPlayer::Setup{_queue, *_source, _sink, at(PlayOptions::kAsFastAsTaken), {}, [this] {
+                                return std::chrono::steady_clock::time_point(_queue.now());
+                            }});
+    _player->play(*CodeFilter::fromStartCommand(
+        {{"SetState", "Streaming"}, {"SetZorellLogCodes", Array{PropertyList::integer(1)}}},
+        false));
+    _queue.runReady();
+    EXPECT_EQ(_sink.diary,
+              (Diary{"0: clock at 0", "0: packet 1 at 0", "0: back 4000 at packet no. 3 at 9000",
+                     "0: clock at 5000", "0: packet 1 at 5001", "0: clock at 7000", "0: end"}));
+}
+
+TEST_F(PacketPlayerTest, AGapIsToldBeforeItIsWaitedFor) {
+    play({{0ms, 1}, {61'000ms, 2}});
+    _queue.advance(500ms);
+    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0",
+                                  "0: gap 61000 at packet no. 2 at 0", "500: clock at 500"}));
+    _queue.advance(60'500ms);
+    EXPECT_EQ(_sink.diary.back(), "61000: packet 2 at 61000");
+}
+
+TEST_F(PacketPlayerTest, OfStampsOutOfRangeTheFirstIsToldOnce) {
+    play({{0ms, 1, true}, {0ms, 2, true}}, at(PlayOptions::kAsFastAsTaken));
+    _queue.runReady();
+    EXPECT_EQ(_sink.diary,
+              (Diary{"0: out of range 0 at packet no. 1", "0: clock at 0", "0: packet 1 at 0",
+                     "0: packet 2 at 0", "0: clock at 2000", "0: end"}));
+}
+
+TEST_F(PacketPlayerTest, TheStampsOfALiveStreamAreHandedOnAndNotRemarkedOn) {
+    PlayOptions options = at(PlayOptions::kAsFastAsTaken);
+    options.live = true;
+    play({{0ms, 1}, {3'600'000ms, 2}, {1000ms, 3}}, options);
+    _queue.runReady();
+    EXPECT_EQ(_sink.diary,
+              (Diary{"0: clock live at 0", "0: packet 1 live at 0", "0: packet 2 live at 3600000",
+                     "0: clock live at 1000", "0: packet 3 live at 1000", "0: clock live at 3000",
+                     "0: end live"}));
+}
+
+TEST_F(PacketPlayerTest, LaterRoundsOfARecordingThatStepsBackStepBackAsFar) {
+    PlayOptions options = at(PlayOptions::kAsFastAsTaken);
+    options.loop = true;
+    play({{10'000ms, 1}, {0ms, 2}}, options);
+    for (int count = 0; count < 2; ++count) {
+        _queue.step();
+    }
+    ASSERT_GE(_sink.diary.size(), 9U);
+    EXPECT_EQ((Diary(_sink.diary.begin(), _sink.diary.begin() + 9)),
+              (Diary{"0: clock at 10000", "0: packet 1 at 10000",
+                     "0: back 10000 at packet no. 2 at 10000", "0: clock at 0", "0: packet 2 at 0",
+                     "0: packet 1 at 2000", "0: back 10000 at packet no. 2 at 2000",
+                     "0: clock at -8000", "0: packet 2 at -8000"}));
 }
 
 TEST_F(PacketPlayerTest, ADestroyedPlayerDoesNothingMore) {

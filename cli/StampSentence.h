@@ -1,0 +1,18 @@
+#pragma once
+
+#include "platform/StampSequence.h"
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+/// What the user is told of an odd stamp.
+namespace pallax {
+
+/// "drive.pcap: no packets for 3600.0 s before packet 18."
+std::string stampSentence(std::string_view source, std::uint64_t packet, const StampRemark& remark);
+
+/// "No packets for 3600.0 s before packet 18": as short as a status line needs it.
+std::string stampNote(std::uint64_t packet, const StampRemark& remark);
+
+} // namespace pallax
