@@ -174,6 +174,15 @@ TEST_F(EndToEndFaults, AServiceKilledWhileStreaming) {
     meets(Fault::KilledWhileStreaming, {" ***** INVALIDATED 0x"});
 }
 
+TEST_F(EndToEndFaults, AClosedPortIsNoticedWhileALiveStreamGoesOnWhoseStampsStand) {
+    const FaultyService service(Fault::ChannelClosedWhileLive);
+    PallaxProcess viewer(world, {"--log-level", "3"});
+    EXPECT_TRUE(viewer.says("<3>Starting the display update timer\n"));
+    EXPECT_TRUE(viewer.says(" ***** INVALIDATED "));
+    viewer.signal(SIGTERM);
+    EXPECT_EQ(viewer.wait(), 0);
+}
+
 TEST_F(EndToEndFaults, AReplyThatComesTooLateIsNoneAndTheNextQueryIsAnswered) {
     meetsOnce(Fault::ReplyTooLate, " ***** Could not send the GetTechnology command (got error=2)");
 }

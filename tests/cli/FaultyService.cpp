@@ -94,6 +94,9 @@ private:
             return technology();
         }
         dieIf(Fault::KilledAtTheStartCommand);
+        if (_isLive) {
+            _queue.async([this] { _channel.reset(); });
+        }
         _queue.async([this] { stream(); });
         return std::nullopt;
     }
@@ -124,7 +127,8 @@ private:
         constexpr LogCode kRegistration = 0x7132;
         constexpr int kPacketsBeforeTheEnd = 5;
         FrameHeader header;
-        header.sourceTime = Time(seconds(1700000000) + seconds(++_packets));
+        header.isLive = _isLive;
+        header.sourceTime = Time(seconds(1700000000) + seconds(_isLive ? 0 : ++_packets));
         ByteBuffer frame;
         appendFrame(frame, header, Record(kRegistration).u8(2).u8(0).u8(0).prefixed());
         const Transfer sent = sendTo(_client, frame);
@@ -144,6 +148,7 @@ private:
     std::unique_ptr<LocalMessagePort> _channel;
     Descriptor _client;
     int _packets = 0;
+    bool _isLive = _fault == Fault::ChannelClosedWhileLive;
 };
 
 /// What the test has open is none of the service's.

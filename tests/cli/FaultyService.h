@@ -15,6 +15,7 @@ enum class Fault {
     KilledAfterTheReply,
     KilledAtTheStartCommand,
     KilledWhileStreaming,
+    ChannelClosedWhileLive, ///< streams on, live, and its stamps stand
     ReplyTooLate,
     ReplyIsNoPropertyList,
     ReplyWithoutTheKey,
