@@ -88,10 +88,9 @@ private:
             if (key) {
                 _replaced(place);
             }
-            auto value = of(entry.value, place, depth + 1);
+            const auto value = of(entry.value, place, depth + 1);
             isChanged = isChanged || key || value;
-            copy.set(key ? Text(std::move(*key)) : entry.key,
-                     value ? std::move(*value) : entry.value);
+            copy.set(key ? Text(std::move(*key)) : entry.key, value ? *value : entry.value);
         }
         return isChanged ? std::optional(PropertyList(std::move(copy))) : std::nullopt;
     }
@@ -103,8 +102,8 @@ private:
 
 PropertyList writableInXml(const PropertyList& object,
                            const std::function<void(const std::string& path)>& replaced) {
-    auto changed = Replacement(replaced).of(object, "");
-    return changed ? std::move(*changed) : object;
+    const auto changed = Replacement(replaced).of(object, "");
+    return changed ? *changed : object;
 }
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #include "host/Descriptor.h"
 #include "host/Recording.h"
-#include "tests/cli/EndToEnd.h"
+#include "tests/cli/EndToEndScreen.h"
 #include "tests/doubles/Files.h"
 
 #include <nlohmann/json.hpp>
@@ -151,6 +151,31 @@ TEST_F(EndToEndSteps, SecondsAfter2038AndStampsThatAreNoTimesAreTheSameInDecodeA
                              "one is taken for it and for others like it.\n";
     EXPECT_EQ(run({"decode", recording}).err, told);
     EXPECT_EQ(run({recording, "--print", "--speed", "max"}).err, told);
+}
+
+TEST_F(EndToEndSteps, WhileAPlayedStreamPausesItsClockRunsOn) {
+    const std::string pipe = world.path("pipe");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
+    const Descriptor both(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // so that nobody waits
+    PallaxProcess viewer(world, {"-", "--print"}, pipe);
+    const auto writer = RecordingWriter::create(pipe, kGsmLinkType);
+    ASSERT_TRUE(writer);
+    EXPECT_EQ((*writer)->write(kSampleStart, registration(2)), std::nullopt);
+    EXPECT_TRUE(viewer.says("MM Service State: REG_STATE_REGISTERING\n"));
+    const std::string shown = viewer.out();
+    EXPECT_GE(shown.substr(shown.find("== ")), "== 2023-11-14 22:13:22 +0000\n")
+        << "not the last packet's time";
+    viewer.signal(SIGTERM);
+    EXPECT_EQ(viewer.wait(), 0);
+}
+
+TEST_F(EndToEndScreen, AStepOfTheStampsIsANoteBesideTheStatus) {
+    PallaxTerminal terminal(
+        world, {record("a.pcap", {{seconds(0), registration(0)}, {seconds(61), registration(2)}})},
+        {});
+    EXPECT_TRUE(terminal.shows("No packets for 61.0 s before packet 2"));
+    terminal.type("q");
+    EXPECT_EQ(terminal.wait(), 0);
 }
 
 /// A live stream, `pallax service --relay -`, whose stamps the test makes.

@@ -121,7 +121,7 @@ public:
             return;
         }
         _saveScreen = std::make_shared<PallaxSaveViewController>(
-            PallaxSaveViewController::Surroundings{frontEnd.toolkit(), files, clock, queue,
+            PallaxSaveViewController::Surroundings{frontEnd.toolkit(), files, clock, clock, queue,
                                                    "/snapshots", [this] { closeSaveScreen(); },
                                                    [] {}},
             saveHistory);
