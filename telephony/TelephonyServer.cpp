@@ -74,8 +74,11 @@ LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
         report(source.error().sentence);
         return {kServiceErrorDomain, EIO, {}};
     }
-    const int number = ++_latestNumber;
-    std::string portName = formatText("%@%@%d", {_setup.controlPortName, kChannelSuffix, number});
+    std::string portName;
+    do { // an earlier service may still be ending
+        portName = formatText("%@%@%d", {_setup.controlPortName, kChannelSuffix, ++_latestNumber});
+    } while (_setup.ports.isTaken(portName));
+    const int number = _latestNumber;
     std::unique_ptr<ServedChannel> channel;
     const int error = ServedChannel::open(
         ServedChannel::Setup{_setup.queue, _setup.ports, portName, localPortName,

@@ -169,6 +169,25 @@ TEST_F(EndToEndRelay, AClientThatComesLateToTheEndStillHearsEverything) {
     EXPECT_EQ(packetsIn(file), kPackets);
 }
 
+TEST_F(EndToEndRelay, WhenItsStreamHasEndedTheNextServiceMayStartAtOnce) {
+    PallaxProcess recorder(world, {"record", world.path("a.pcapng")});
+    ASSERT_TRUE(clientsStream(1));
+    recorder.signal(SIGSTOP); // the service waits for it
+    send(seconds(0), 0);
+    device.reset();
+    ASSERT_TRUE(service->says("The stream has ended."));
+    PallaxProcess next(world, {"service", "--simulate", "lte"});
+    EXPECT_TRUE(eventually([&] {
+        return run({"service", "--status"}).out.starts_with("Technology: Zorell_LTE\n");
+    })) << next.err();
+    recorder.signal(SIGCONT);
+    EXPECT_EQ(recorder.wait(), 0);
+    EXPECT_EQ(service->wait(), 0);
+    EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
+    next.signal(SIGTERM);
+    EXPECT_EQ(next.wait(), 0) << next.err();
+}
+
 TEST_F(EndToEndRelay, AStreamThatBreaksOffInAPacketIsAFailure) {
     PallaxProcess recorder(world, {"record", world.path("a.pcapng")});
     ASSERT_TRUE(clientsStream(1));

@@ -125,6 +125,15 @@ TEST_F(TelephonyServerTest, EveryChannelPlaysFromTheRecordingsStart) {
     }
 }
 
+TEST_F(TelephonyServerTest, AChannelPortsNameThatIsTakenIsPassedOver) {
+    start(recordLte(_folder, 1));
+    const auto taken = _ports.createLocal("com.norvane.telephony.LogChannel.1", {});
+    ASSERT_NE(taken.port, nullptr);
+    const LogChannel channel = openChannel();
+    EXPECT_EQ(channel.errorCode, 0);
+    EXPECT_EQ(channel.remotePortName, "com.norvane.telephony.LogChannel.2");
+}
+
 TEST_F(TelephonyServerTest, TheServersEndInvalidatesTheClientsPorts) {
     start(recordLte(_folder, 1));
     const LogChannel channel = openChannel();
