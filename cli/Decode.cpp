@@ -14,12 +14,23 @@
 
 #include <algorithm>
 #include <cstdio>
+#include <optional>
+#include <string>
+#include <sys/stat.h>
 #include <thread>
 #include <unistd.h>
 
 namespace pallax {
 
 namespace {
+
+/// Nothing for what cannot be looked at; its reader has the sentence. "-" is standard input.
+std::optional<struct stat> fileStatus(const std::string& recording) {
+    struct stat status {};
+    const int result =
+        recording == "-" ? ::fstat(STDIN_FILENO, &status) : ::stat(recording.c_str(), &status);
+    return result == 0 ? std::optional(status) : std::nullopt;
+}
 
 /// Gives the command, wired to this machine, to `use`.
 template <class Use>

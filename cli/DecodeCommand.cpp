@@ -24,57 +24,60 @@ ExitStatus DecodeCommand::run(Output& output) {
     const auto displays = displayOutput(_options, output, true);
     ExitStatus status = kExitSuccess;
     for (std::size_t place = 0; place < _options.recordings.size(); ++place) {
-        const ExitStatus result = decodeNext(place, *displays);
+        const ExitStatus result = decodeNext(place, {output, *displays});
         status = result == kExitSuccess ? status : result;
+        output.flush(); // the next recording may be one that is waited for
         if (result == kExitFatalRecord) {
             break;
         }
     }
-    output.flush();
     return status;
 }
 
 ExitStatus DecodeCommand::runOne(std::size_t recording, Output& output) {
     const auto displays = displayOutput(_options, output, recording == 0);
-    const ExitStatus status = decodeNext(recording, *displays);
+    const ExitStatus status = decodeNext(recording, {output, *displays});
     output.flush();
     return status;
 }
 
-ExitStatus DecodeCommand::decodeNext(std::size_t place, DisplayOutput& output) {
+ExitStatus DecodeCommand::decodeNext(std::size_t place, const Destination& destination) {
     _place = place;
-    const ExitStatus status = decodePath(_options.recordings.at(place), output);
+    const ExitStatus status = decodePath(_options.recordings.at(place), destination);
     if (_watcher != nullptr) {
         _watcher->recordingDone(place);
     }
     return status;
 }
 
-ExitStatus DecodeCommand::decodePath(const std::string& path, DisplayOutput& output) {
+ExitStatus DecodeCommand::decodePath(const std::string& path, const Destination& destination) {
     const Recording::OpenResult recording = _open(path);
     if (!recording) {
         _report(recording.error().sentence);
         return kExitFailure;
     }
-    return decode(**recording, output);
+    return decode(**recording, destination);
 }
 
-ExitStatus DecodeCommand::decode(Recording& recording, DisplayOutput& output) {
+ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destination) {
     const RecordedTechnology* technology =
         _options.technology != nullptr ? _options.technology : recording.technology();
     if (technology == nullptr) {
         _report(recording.foreignLinkType().sentence);
         return kExitFailure;
     }
-    RecordingDecoder decoder(_environment, technology->identifier, _options.chosenEvery(), output);
+    RecordingDecoder decoder(_environment, technology->identifier, _options.chosenEvery(),
+                             destination.displays);
     if (!decoder.hasGenerator()) {
         _report(noGeneratorSentence(recording.name(), technology->identifier));
         return kExitFailure;
     }
-    return decodePackets(recording, decoder);
+    return decodePackets(recording, decoder, destination.output);
 }
 
-ExitStatus DecodeCommand::decodePackets(Recording& recording, RecordingDecoder& decoder) {
+ExitStatus DecodeCommand::decodePackets(Recording& recording, RecordingDecoder& decoder,
+                                        Output& output) {
+    const bool isWaitedFor = !recording.position();
     bool toldOutOfRange = false;
     while (const auto packet = recording.next()) {
         const auto reason = decoder.add(*packet);
@@ -93,6 +96,9 @@ ExitStatus DecodeCommand::decodePackets(Recording& recording, RecordingDecoder& 
             if (_options.strict) {
                 return kExitFatalRecord;
             }
+        }
+        if (isWaitedFor) {
+            output.flush(); // what a packet has completed is read before the next one comes
         }
         if (_watcher != nullptr) {
             _watcher->packetDone(_place, recording, decoder.packets());

@@ -58,17 +58,23 @@ public:
         : _options(options), _environment(environment), _open(std::move(open)),
           _report(std::move(report)), _watcher(watcher) {}
 
-    /// Writes to `output`, whose exceptions leave.
+    /// Writes to `output`, whose exceptions leave. What a recording gives that
+    /// is waited for (a pipe) is written with each display, that of a file in blocks.
     ExitStatus run(Output& output);
     /// The same for one of the recordings, by its place; only the first writes what stands at the
     /// head of the whole output.
     ExitStatus runOne(std::size_t recording, Output& output);
 
 private:
-    ExitStatus decodeNext(std::size_t place, DisplayOutput& output);
-    ExitStatus decodePath(const std::string& path, DisplayOutput& output);
-    ExitStatus decode(Recording& recording, DisplayOutput& output);
-    ExitStatus decodePackets(Recording& recording, RecordingDecoder& decoder);
+    struct Destination {
+        Output& output;
+        DisplayOutput& displays; // which end up there
+    };
+
+    ExitStatus decodeNext(std::size_t place, const Destination& destination);
+    ExitStatus decodePath(const std::string& path, const Destination& destination);
+    ExitStatus decode(Recording& recording, const Destination& destination);
+    ExitStatus decodePackets(Recording& recording, RecordingDecoder& decoder, Output& output);
 
     DecodeOptions _options;
     DecoderEnvironment _environment;

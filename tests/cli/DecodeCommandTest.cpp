@@ -41,7 +41,10 @@ protected:
             return std::move(found->second);
         };
         const auto report = [this](std::string_view sentence) { reports.emplace_back(sentence); };
-        Output output([this](std::string_view block) { written += block; });
+        Output output([this](std::string_view block) {
+            written += block;
+            blocks.emplace_back(block);
+        });
         DecodeCommand command(options, {resources, bundle, notices, doubles::kScriptedTechnologies},
                               open, report);
         return command.run(output);
@@ -50,6 +53,7 @@ protected:
     DecodeOptions options;
     std::map<std::string, std::unique_ptr<Recording>> recordings;
     std::string written;
+    std::vector<std::string> blocks; // the same, as it was handed on
     std::vector<std::string> reports;
     doubles::FakeResources resources;
     doubles::FakeBundle bundle;
@@ -249,6 +253,39 @@ TEST_F(DecodeCommandTest, ATechnologyWithoutAGeneratorIsNamed) {
     EXPECT_EQ(run(), kExitFailure);
     EXPECT_EQ(reports, std::vector<std::string>{
                            "other.pcap: there is no log generator for the technology Another."});
+}
+
+/// A recording whose bytes can be counted, as those of a file.
+class ScriptedFile final : public Recording {
+public:
+    explicit ScriptedFile(ScriptedRecording recording) : _recording(std::move(recording)) {}
+    const std::string& name() const override { return _recording.name(); }
+    int linkType() const override { return _recording.linkType(); }
+    const RecordedTechnology* technology() const override { return _recording.technology(); }
+    RecordingError foreignLinkType() const override { return _recording.foreignLinkType(); }
+    std::optional<RecordedPacket> next() override { return _recording.next(); }
+    std::optional<std::uint64_t> position() const override { return 0; }
+    const std::optional<RecordingError>& error() const override { return _recording.error(); }
+
+private:
+    ScriptedRecording _recording;
+};
+
+TEST_F(DecodeCommandTest, WhatARecordingGivesThatIsWaitedForIsWrittenAtOnceAndAFileInBlocks) {
+    options.every = Every::Packet;
+    const Packets packets{{milliseconds(0), "A=1"}, {milliseconds(1), "A=2"}};
+    options.recordings.emplace_back("file.pcap");
+    recordings["file.pcap"] =
+        std::make_unique<ScriptedFile>(ScriptedRecording("file.pcap", packets));
+    add("pipe", packets);
+    EXPECT_EQ(run(), kExitSuccess);
+    const std::string first =
+        R"({"packet":1,"time":"2023-11-14T22:13:20.000Z","display":{"Cell":{"A":"1"}}})"
+        "\n";
+    const std::string second =
+        R"({"packet":2,"time":"2023-11-14T22:13:20.001Z","display":{"Cell":{"A":"2"}}})"
+        "\n";
+    EXPECT_EQ(blocks, (std::vector<std::string>{first + second, first, second}));
 }
 
 TEST_F(DecodeCommandTest, CsvGivesARowForEachChangeFromTickToTick) {
