@@ -171,10 +171,6 @@ ExitStatus runBrowse(const BrowseOptions& options) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
-    if (const auto missing = missingTemplates()) {
-        complain(*missing);
-        return kExitFailure;
-    }
     const Request request{options, *settings,
                           options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,
                           !options.print && terminal::CursesTerminal::isPossible()};

@@ -2,9 +2,9 @@
 
 #include "cli/FatalRecord.h"
 #include "cli/LinkPorts.h"
+#include "cli/RequiredTemplates.h"
 #include "host/AsioMainQueue.h"
 #include "host/BuildBundle.h"
-#include "host/DirectoryResources.h"
 #include "host/SocketMessagePorts.h"
 #include "host/SourceClock.h"
 #include "host/WallClock.h"
@@ -56,7 +56,7 @@ private:
     SocketTelephonyService _telephony;
     LinkPorts _linkPorts;
     GuardedMessagePorts _ports;
-    DirectoryResources _resources;
+    RequiredTemplates _resources;
     BuildBundle _bundle;
 };
 

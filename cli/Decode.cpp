@@ -2,11 +2,10 @@
 #include "cli/DecodeProgress.h"
 #include "cli/DroppedNotices.h"
 #include "cli/OrderedWorkers.h"
-#include "cli/Preconditions.h"
 #include "cli/Programs.h"
+#include "cli/RequiredTemplates.h"
 #include "cli/ScopedLog.h"
 #include "host/BuildBundle.h"
-#include "host/DirectoryResources.h"
 #include "host/LogSinks.h"
 #include "host/MonotonicClock.h"
 #include "host/RecordingFile.h"
@@ -35,7 +34,7 @@ std::optional<struct stat> fileStatus(const std::string& recording) {
 /// Gives the command, wired to this machine, to `use`.
 template <class Use>
 ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, const Use& use) {
-    const DirectoryResources resources(DirectoryResources::programFolder());
+    const RequiredTemplates resources(DirectoryResources::programFolder());
     const BuildBundle bundle;
     DroppedNotices notices;
     const auto report = [&progress](std::string_view sentence) {
@@ -170,10 +169,6 @@ ExitStatus decodeAll(const DecodeOptions& options, FileSink* log) {
 } // namespace
 
 ExitStatus runDecode(const DecodeOptions& options) {
-    if (const auto missing = missingTemplates()) {
-        complain(*missing);
-        return kExitFailure;
-    }
     if (!options.systemLog) {
         return decodeAll(options, nullptr);
     }

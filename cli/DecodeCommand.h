@@ -58,7 +58,7 @@ public:
         : _options(options), _environment(environment), _open(std::move(open)),
           _report(std::move(report)), _watcher(watcher) {}
 
-    /// Writes to `output`, whose exceptions leave. What a recording gives that
+    /// Writes to `output`, whose exceptions leave, and TemplateFailure. What a recording gives that
     /// is waited for (a pipe) is written with each display, that of a file in blocks.
     ExitStatus run(Output& output);
     /// The same for one of the recordings, by its place; only the first writes what stands at the

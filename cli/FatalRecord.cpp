@@ -1,6 +1,7 @@
 #include "cli/FatalRecord.h"
 
 #include "LogGenerator/LogPacket.h"
+#include "cli/RequiredTemplates.h"
 #include "platform/SystemLog.h"
 
 namespace pallax {
@@ -33,6 +34,8 @@ MessagePorts::Local GuardedMessagePorts::createLocal(std::string_view name,
         const std::uint64_t packet = told != 0 ? told : counted;
         try {
             return receive(identifier, data);
+        } catch (const TemplateFailure&) {
+            throw;
         } catch (const std::exception& error) {
             self->failed(packet, data, error.what());
             return std::nullopt;

@@ -1,5 +1,6 @@
 #include "cli/OrderedWorkers.h"
 
+#include "cli/Output.h"
 #include "cli/Programs.h"
 #include "platform/Format.h"
 
@@ -21,7 +22,7 @@ namespace pallax {
 namespace {
 
 /// How many pieces may be done or under way ahead of the one that is collected next: each holds
-/// three descriptors.
+/// three descriptors. Where there are fewer, the next piece waits for others to be collected.
 constexpr std::size_t kMostAhead = 64;
 /// Of a worker whose work threw; no exit status of a decode.
 constexpr int kGaveUp = 71;
@@ -95,7 +96,14 @@ void readWhole(const Descriptor& file, const std::function<void(std::string_view
     off_t at = 0;
     for (;;) {
         const ssize_t length = ::pread(file.number(), block.data(), block.size(), at);
-        if (length <= 0) {
+        if (length < 0 && errno == EINTR) {
+            continue;
+        }
+        if (length < 0) {
+            throw OutputFailure(
+                formatText("A temporary file cannot be read: %@.", {std::strerror(errno)}));
+        }
+        if (length == 0) {
             return;
         }
         take({block.data(), static_cast<std::size_t>(length)});
@@ -162,8 +170,9 @@ std::optional<HostError> OrderedWorkers::startNext() {
 }
 
 /// Ends without the ends of what the parent has begun: no destructor runs, no buffer is written.
-void OrderedWorkers::become(Worker& worker, std::size_t piece) const {
+void OrderedWorkers::become(Worker& worker, std::size_t piece) {
     (void)::prctl(PR_SET_PDEATHSIG, SIGKILL);
+    _workers.clear(); // their files would leave this one too few descriptors to open its own
     const ChildSignal unblocked(SIG_UNBLOCK);
     if (::dup2(worker.files.output.number(), STDOUT_FILENO) < 0 ||
         ::dup2(worker.files.complaints.number(), STDERR_FILENO) < 0) {

@@ -24,7 +24,8 @@ struct WorkerFiles {
     static Result<WorkerFiles, HostError> create();
 };
 
-/// Hands the whole content of a worker's file on, in blocks.
+/// Hands the whole content of a worker's file on, in blocks; throws OutputFailure where it cannot
+/// be read.
 void readWhole(const Descriptor& file, const std::function<void(std::string_view)>& take);
 
 /// Pieces of work that processes of their own do, so many at once, each with its files; what they
@@ -68,7 +69,7 @@ private:
 
     std::size_t running() const;
     std::optional<HostError> startNext();
-    [[noreturn]] void become(Worker& worker, std::size_t piece) const;
+    [[noreturn]] void become(Worker& worker, std::size_t piece);
     pid_t nextEnded(int& status) const;
     void waitForOne();
 

@@ -1,20 +1,10 @@
 #include "cli/Preconditions.h"
 
-#include "host/DirectoryResources.h"
 #include "platform/Format.h"
 
 #include <algorithm>
 
 namespace pallax {
-
-std::optional<std::string> missingTemplates() {
-    const std::string folder = DirectoryResources::programFolder();
-    if (!DirectoryResources(folder).propertyListPaths().empty()) {
-        return std::nullopt;
-    }
-    return formatText("There are no display templates in %@; PALLAX_RESOURCES names their folder.",
-                      {folder});
-}
 
 std::string noGeneratorSentence(std::string_view recording, std::string_view technology) {
     return formatText("%@: there is no log generator for the technology %@.",

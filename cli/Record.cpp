@@ -1,4 +1,3 @@
-#include "cli/Preconditions.h"
 #include "cli/Programs.h"
 #include "cli/Recorder.h"
 #include "cli/ScopedLog.h"
@@ -19,10 +18,6 @@ namespace {
 constexpr int kNothing = -1;
 
 ExitStatus record(const RecordOptions& options) {
-    if (const auto missing = missingTemplates()) {
-        complain(*missing);
-        return kExitFailure;
-    }
     auto directory = SocketDirectory::open();
     if (!directory) {
         complain(directory.error().sentence);

@@ -1,5 +1,7 @@
 #include "cli/RecordingDecoder.h"
 
+#include "cli/RequiredTemplates.h"
+
 #include <exception>
 
 namespace pallax {
@@ -22,6 +24,8 @@ std::optional<std::string> RecordingDecoder::add(const RecordedPacket& packet) {
     ++_packets;
     try {
         _generator->updateState(_state, packet.data);
+    } catch (const TemplateFailure&) {
+        throw;
     } catch (const std::exception& error) {
         return error.what();
     }

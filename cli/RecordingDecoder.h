@@ -51,6 +51,7 @@ public:
     bool hasGenerator() const { return _generator != nullptr; }
 
     /// The reason why the packet was dropped, when a record has thrown; else nothing.
+    /// TemplateFailure leaves.
     std::optional<std::string> add(const RecordedPacket& packet);
     /// The last tick, and with Every::End the display.
     void finish();

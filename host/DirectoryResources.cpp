@@ -1,6 +1,7 @@
 #include "host/DirectoryResources.h"
 
 #include "host/Files.h"
+#include "platform/Format.h"
 #include "platform/PropertyListCodec.h"
 
 #include <algorithm>
@@ -32,17 +33,35 @@ std::string DirectoryResources::folderFor(const std::string& program) {
     return ((isBuilt ? folder : folder.parent_path()) / part).native();
 }
 
+Result<PropertyList, HostError> DirectoryResources::load(std::string_view name) const {
+    const std::string path = _folder + "/" + std::string(name) + std::string(kExtension);
+    const auto failed = [&path](std::string_view reason) {
+        return HostError{
+            formatText("The display template %@ cannot be loaded: %@.", {path, reason})};
+    };
+    const auto content = readRegularFile(path, kLargestPropertyList);
+    if (!content) {
+        return failed(content.error().reason);
+    }
+    auto parsed = parsePropertyList(*content);
+    if (!parsed) {
+        return failed(parsed.error().text());
+    }
+    if (parsed->dictionary() == nullptr) {
+        return failed("it is no dictionary");
+    }
+    return std::move(parsed).value();
+}
+
 std::optional<PropertyList> DirectoryResources::propertyList(std::string_view name) const {
     if (name.empty() || name.find('/') != std::string_view::npos) {
         return std::nullopt;
     }
-    const auto content =
-        readFile(_folder + "/" + std::string(name) + std::string(kExtension), kLargestPropertyList);
-    auto parsed = parsePropertyList(content ? Bytes(*content) : Bytes());
-    return parsed ? std::optional(std::move(parsed).value()) : std::nullopt;
+    auto loaded = load(name);
+    return loaded ? std::optional(std::move(loaded).value()) : std::nullopt;
 }
 
-std::vector<std::string> DirectoryResources::propertyListPaths() const {
+Result<std::vector<std::string>, HostError> DirectoryResources::list() const {
     namespace fs = std::filesystem;
     std::vector<std::string> paths;
     std::error_code error;
@@ -55,8 +74,17 @@ std::vector<std::string> DirectoryResources::propertyListPaths() const {
         }
         entry.increment(error);
     }
+    if (error) {
+        return HostError{formatText("The display templates in %@ cannot be listed: %@.",
+                                    {_folder, error.message()})};
+    }
     std::sort(paths.begin(), paths.end());
     return paths;
+}
+
+std::vector<std::string> DirectoryResources::propertyListPaths() const {
+    auto paths = list();
+    return paths ? std::move(paths).value() : std::vector<std::string>();
 }
 
 } // namespace pallax

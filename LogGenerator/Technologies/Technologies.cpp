@@ -22,4 +22,8 @@ std::span<const Technology> technologies() {
     return kTechnologies;
 }
 
+bool isTemplateOfUtran(std::string_view path) {
+    return UTRANLogGenerator::isTemplate(path);
+}
+
 } // namespace pallax

@@ -18,18 +18,10 @@ constexpr char upperCase(char letter) {
     return letter >= 'a' && letter <= 'z' ? static_cast<char>(letter - 'a' + 'A') : letter;
 }
 
-/// Anywhere in the path counts, its folders included.
-bool namesTechnology(std::string_view path) {
-    constexpr std::string_view kTechnology = "UTRAN";
-    const auto found = std::search(path.begin(), path.end(), kTechnology.begin(), kTechnology.end(),
-                                   [](char a, char b) { return upperCase(a) == b; });
-    return found != path.end();
-}
-
 /// The name under which the resources hold the template; nothing when none of them is one.
 std::optional<std::string> templateName(const Resources& resources) {
     const auto paths = resources.propertyListPaths();
-    const auto found = std::find_if(paths.begin(), paths.end(), namesTechnology);
+    const auto found = std::find_if(paths.begin(), paths.end(), UTRANLogGenerator::isTemplate);
     if (found == paths.end()) {
         return std::nullopt;
     }
@@ -48,6 +40,13 @@ UTRANLogGenerator::UTRANLogGenerator(const GeneratorEnvironment& environment,
 
 UTRANLogGenerator::UTRANLogGenerator(const GeneratorEnvironment& environment)
     : ZORLogGenerator2(environment, kWithoutParts) {}
+
+bool UTRANLogGenerator::isTemplate(std::string_view path) {
+    constexpr std::string_view kTechnology = "UTRAN";
+    const auto found = std::search(path.begin(), path.end(), kTechnology.begin(), kTechnology.end(),
+                                   [](char a, char b) { return upperCase(a) == b; });
+    return found != path.end();
+}
 
 std::unique_ptr<LogGenerator>
 UTRANLogGenerator::generator(const GeneratorEnvironment& environment) {

@@ -3,6 +3,7 @@
 #include "LogGenerator/ZORLogGenerator2.h"
 
 #include <string>
+#include <string_view>
 
 namespace pallax {
 
@@ -14,6 +15,8 @@ namespace pallax {
 class UTRANLogGenerator final : public ZORLogGenerator2 {
 public:
     static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment);
+    /// Whether the path contains "UTRAN", anywhere, its folders included.
+    static bool isTemplate(std::string_view path);
 
     /// Over the template of that name.
     UTRANLogGenerator(const GeneratorEnvironment& environment, std::string templateName);

@@ -1,6 +1,7 @@
 #include "cli/DecodeCommand.h"
 
 #include "cli/DroppedNotices.h"
+#include "cli/RequiredTemplates.h"
 #include "tests/cli/ScriptedRadio.h"
 #include "tests/doubles/FakeBundle.h"
 #include "tests/doubles/FakeResources.h"
@@ -286,6 +287,19 @@ TEST_F(DecodeCommandTest, WhatARecordingGivesThatIsWaitedForIsWrittenAtOnceAndAF
         R"({"packet":2,"time":"2023-11-14T22:13:20.001Z","display":{"Cell":{"A":"2"}}})"
         "\n";
     EXPECT_EQ(blocks, (std::vector<std::string>{first + second, first, second}));
+}
+
+TEST_F(DecodeCommandTest, ATemplateThatCannotBeLoadedIsNoFaultOfItsPacket) {
+    add("a.pcap", {{milliseconds(0), "A=1"}});
+    add("b.pcap", {{milliseconds(0), "?the template is gone"}});
+    try {
+        (void)run();
+        ADD_FAILURE() << "it does not leave";
+    } catch (const TemplateFailure& failure) {
+        EXPECT_STREQ(failure.what(), "the template is gone");
+    }
+    EXPECT_EQ(written, "{\"Cell\":{\"A\":\"1\"}}\n") << "what came before is written";
+    EXPECT_EQ(reports, std::vector<std::string>{});
 }
 
 TEST_F(DecodeCommandTest, CsvGivesARowForEachChangeFromTickToTick) {

@@ -24,7 +24,7 @@ using std::chrono::steady_clock;
 
 constexpr milliseconds kShortRetryDelay{20};
 /// Within so long of the service's return the viewer is to be back in view.
-constexpr seconds kPatience{5};
+constexpr seconds kViewerPatience{5};
 
 /// Timers that fire a hundred times as often: a viewer finds at its display tick, every 2 s, that
 /// its service has gone.
@@ -49,7 +49,7 @@ public:
 
     /// Runs until the condition holds; false when it does not in time.
     bool runUntil(const std::function<bool()>& condition) {
-        const auto end = steady_clock::now() + kPatience;
+        const auto end = steady_clock::now() + kViewerPatience;
         while (!condition()) {
             if (steady_clock::now() > end) {
                 return false;
@@ -241,17 +241,6 @@ TEST_F(EndToEndFaults, After200KilledServicesNothingHasLeakedAndTheViewerIsInVie
     }
     EXPECT_EQ(world.sockets(), std::vector<std::string>());
     EXPECT_TRUE(noChildLeft());
-}
-
-TEST_F(EndToEnd, WithoutDisplayTemplatesThereIsNothingToShow) {
-    const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)}});
-    world.environment = {"PALLAX_RESOURCES=/nonexistent"};
-    for (const Run& failed : {run({"decode", recording}), run({recording, "--print"})}) {
-        EXPECT_EQ(failed.status, 1);
-        EXPECT_EQ(failed.out, "");
-        EXPECT_EQ(failed.err, "pallax: There are no display templates in /nonexistent; "
-                              "PALLAX_RESOURCES names their folder.\n");
-    }
 }
 
 /// Every program that needs the folder of sockets refuses it with the same sentence.

@@ -176,16 +176,5 @@ TEST_F(EndToEndStatus, OfTheTextsForPackages) {
     ends({{"manual"}, 2, "pallax: PAGE is required (pallax manual --help tells more)\n"});
 }
 
-TEST_F(EndToEndStatus, WithoutDisplayTemplatesIsFailure) {
-    const std::string sentence = "pallax: There are no display templates in /nonexistent; "
-                                 "PALLAX_RESOURCES names their folder.\n";
-    for (const std::vector<std::string>& arguments : {std::vector<std::string>{"decode", sample},
-                                                      {sample, "--print"},
-                                                      {"demo", "--print"},
-                                                      {"record", world.path("new.pcapng")}}) {
-        ends({arguments, 1, sentence, "/dev/null", "", {"PALLAX_RESOURCES=/nonexistent"}});
-    }
-}
-
 } // namespace
 } // namespace pallax

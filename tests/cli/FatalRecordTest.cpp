@@ -1,5 +1,6 @@
 #include "cli/FatalRecord.h"
 
+#include "cli/RequiredTemplates.h"
 #include "tests/doubles/FakePorts.h"
 #include "tests/doubles/RecordingLog.h"
 #include "tests/doubles/SteppedQueue.h"
@@ -47,6 +48,9 @@ protected:
         port = guard
                    ->createLocal("log channel",
                                  [this](std::int32_t, Bytes data) {
+                                     if (data.empty()) {
+                                         throw TemplateFailure("no template");
+                                     }
                                      if (data.size() == kExtended.size()) {
                                          throw std::runtime_error("bad list");
                                      }
@@ -92,6 +96,13 @@ TEST_F(GuardedMessagePortsTest, WithSkipItIsALineOfTheSystemLog) {
     EXPECT_EQ(received, 1);
     EXPECT_EQ(log.lines(), (Lines{{3, "packet 1 (log code 0xFF0000): bad list"},
                                   {3, "packet 3 (log code 0xFF0000): bad list"}}));
+}
+
+TEST_F(GuardedMessagePortsTest, ATemplateThatCannotBeLoadedIsNoRecordsFault) {
+    open(OnFatalRecord::Skip);
+    fakes.deliver({});
+    EXPECT_THROW(queue.runReady(), TemplateFailure);
+    EXPECT_EQ(log.lines(), Lines{});
 }
 
 TEST_F(GuardedMessagePortsTest, RemotePortsAreThoseOfThePlatform) {

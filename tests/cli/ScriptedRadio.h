@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/LogGenerator.h"
+#include "cli/RequiredTemplates.h"
 #include "host/Recording.h"
 #include "platform/Clock.h"
 
@@ -19,7 +20,8 @@ inline constexpr Time kFirstPacket{std::chrono::seconds{1700000000}}; // 2023-11
 inline constexpr NumberFormat kScriptedDbm{"%.2f dBm"};
 
 /// Packets are texts: "KEY=VALUE" stores a value in the display's section "Cell" ("KEY=-94.75dBm"
-/// as a display number), "KEY" alone removes one, "!REASON" throws.
+/// as a display number), "KEY" alone removes one, "!REASON" throws, "?SENTENCE" misses its
+/// template.
 class ScriptedGenerator final : public LogGenerator {
 public:
     using LogGenerator::LogGenerator;
@@ -40,6 +42,9 @@ public:
         const std::string text(data.begin(), data.end());
         if (text.starts_with('!')) {
             throw std::runtime_error(text.substr(1));
+        }
+        if (text.starts_with('?')) {
+            throw TemplateFailure(text.substr(1));
         }
         if (!state.contains("Display")) {
             state.set("Display", Dictionary{{"Cell", Dictionary{}}});

@@ -177,6 +177,30 @@ TEST_F(HostFilesTest, ResourcesAreFoundByNameAndListedSorted) {
               std::vector<std::string>());
 }
 
+TEST_F(HostFilesTest, AResourceThatCannotBeLoadedIsNamedWithTheReason) {
+    const DirectoryResources resources(_folder.path());
+    const auto reasonOf = [&](const std::string& name) {
+        const auto loaded = resources.load(name);
+        const std::string begin =
+            "The display template " + _folder.file(name + ".plist") + " cannot be loaded: ";
+        return loaded ? "none"
+               : loaded.error().sentence.starts_with(begin)
+                   ? loaded.error().sentence.substr(begin.size())
+                   : loaded.error().sentence;
+    };
+    EXPECT_EQ(reasonOf("absent"), "No such file or directory.");
+    std::filesystem::create_directories(_folder.file("folder.plist"));
+    EXPECT_EQ(reasonOf("folder"), "Is a directory.");
+    (void)_folder.write("cut.plist", "<plist version=\"1.0\"><dict>");
+    EXPECT_EQ(reasonOf("cut"), "at byte 26: malformed XML: Start-end tags mismatch.");
+    (void)_folder.write("list.plist", "( a, b )");
+    EXPECT_EQ(reasonOf("list"), "it is no dictionary.");
+    (void)_folder.write("good.plist", "{ a = b; }");
+    EXPECT_EQ(*resources.load("good"), PropertyList(Dictionary{{"a", "b"}}));
+    EXPECT_EQ(DirectoryResources("/nonexistent").list().error().sentence,
+              "The display templates in /nonexistent cannot be listed: No such file or directory.");
+}
+
 TEST_F(HostFilesTest, TheResourceFolderMayBeChosen) {
     (void)::setenv("PALLAX_RESOURCES", "/some/folder", 1);
     EXPECT_EQ(DirectoryResources::programFolder(), "/some/folder");

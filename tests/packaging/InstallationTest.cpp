@@ -55,9 +55,9 @@ TEST_F(Installation, TheInstalledProgramDecodesARecordingWithTheInstalledTemplat
     }
     const auto without = runCommand("env -u PALLAX_RESOURCES " + decode);
     EXPECT_EQ(without.status, 1);
-    EXPECT_EQ(without.out, "pallax: There are no display templates in " +
-                               prefix.path("share/pallax") +
-                               "; PALLAX_RESOURCES names their folder.\n");
+    EXPECT_EQ(without.out, "pallax: The display template " +
+                               prefix.path("share/pallax/ZOR_GSM.plist") +
+                               " cannot be loaded: No such file or directory.\n");
 }
 
 TEST_F(Installation, EveryManualPageAndCompletionIsThere) {
