@@ -31,6 +31,35 @@ std::optional<struct stat> fileStatus(const std::string& recording) {
     return result == 0 ? std::optional(status) : std::nullopt;
 }
 
+/// The sentence's name of the recording that is the same file, by whatever path; else nothing.
+std::optional<std::string> recordingIn(const struct stat& file, const DecodeOptions& options) {
+    for (const std::string& recording : options.recordings) {
+        const auto status = fileStatus(recording);
+        if (status && S_ISREG(file.st_mode) && status->st_dev == file.st_dev &&
+            status->st_ino == file.st_ino) {
+            return recording == "-" ? "of standard input" : recording;
+        }
+    }
+    return std::nullopt;
+}
+
+/// Why one of the recordings would be written over; nothing when none would.
+std::optional<std::string> lossOfInput(const DecodeOptions& options) {
+    struct stat file {};
+    if (::fstat(STDOUT_FILENO, &file) == 0) {
+        if (const auto recording = recordingIn(file, options)) {
+            return formatText("Standard output would go into the recording %@.", {*recording});
+        }
+    }
+    if (options.systemLog && ::stat(options.systemLog->c_str(), &file) == 0) {
+        if (const auto recording = recordingIn(file, options)) {
+            return formatText("The system log %@ would replace the recording %@.",
+                              {*options.systemLog, *recording});
+        }
+    }
+    return std::nullopt;
+}
+
 /// Gives the command, wired to this machine, to `use`.
 template <class Use>
 ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, const Use& use) {
@@ -169,6 +198,10 @@ ExitStatus decodeAll(const DecodeOptions& options, FileSink* log) {
 } // namespace
 
 ExitStatus runDecode(const DecodeOptions& options) {
+    if (const auto loss = lossOfInput(options)) {
+        complain(*loss);
+        return kExitFailure;
+    }
     if (!options.systemLog) {
         return decodeAll(options, nullptr);
     }

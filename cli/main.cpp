@@ -1,6 +1,7 @@
 #include "cli/FatalRecord.h"
 #include "cli/Output.h"
 #include "cli/Programs.h"
+#include "host/StandardDescriptors.h"
 #include "telephony/ChildService.h"
 
 #include <csignal>
@@ -52,6 +53,9 @@ ExitStatus run(std::vector<std::string> arguments) {
 } // namespace
 
 int main(int argc, char** argv) {
+    if (!openStandardDescriptors()) {
+        return kExitFailure; // there is nowhere to say so
+    }
     if (argc > 1 && argv[1] == kChildServiceCommand) {
         return runChildService(argc, argv);
     }

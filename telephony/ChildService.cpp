@@ -258,7 +258,8 @@ std::string ChildService::takeComplaints() {
 }
 
 int runChildService(int argc, char** argv) {
-    if (argc != kArgumentCount) {
+    // Without a parent that waits there, the number would be that of a file of its own.
+    if (argc != kArgumentCount || ::fcntl(kReadyDescriptor, F_GETFD) < 0) {
         return 2;
     }
     const std::vector<std::string> arguments(argv, argv + argc);

@@ -68,7 +68,7 @@ TEST_F(EndToEndTemplate, ThatIsCutIsOneSentenceAndFailure) {
 TEST_F(EndToEndTemplate, ThatCannotBeReadIsOneSentenceAndFailure) {
     fs::remove(file("ZOR_GSM.plist"));
     fs::create_directory(file("ZOR_GSM.plist")); // root may read any file
-    isRefusedEverywhere(sample("gsm-attach.pcap"), unloadable("ZOR_GSM.plist", "Is a directory"));
+    isRefusedEverywhere(sample("gsm-attach.pcap"), unloadable("ZOR_GSM.plist", "it is a folder"));
     fs::remove(file("ZOR_GSM.plist"));
     std::ofstream(file("ZOR_GSM.plist")) << "( a, b )";
     isRefusedEverywhere(sample("gsm-attach.pcap"),

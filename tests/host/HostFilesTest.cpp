@@ -190,7 +190,7 @@ TEST_F(HostFilesTest, AResourceThatCannotBeLoadedIsNamedWithTheReason) {
     };
     EXPECT_EQ(reasonOf("absent"), "No such file or directory.");
     std::filesystem::create_directories(_folder.file("folder.plist"));
-    EXPECT_EQ(reasonOf("folder"), "Is a directory.");
+    EXPECT_EQ(reasonOf("folder"), "it is a folder.");
     (void)_folder.write("cut.plist", "<plist version=\"1.0\"><dict>");
     EXPECT_EQ(reasonOf("cut"), "at byte 26: malformed XML: Start-end tags mismatch.");
     (void)_folder.write("list.plist", "( a, b )");
