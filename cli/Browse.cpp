@@ -9,6 +9,7 @@
 #include "cli/ScreenBrowser.h"
 #include "cli/Settings.h"
 #include "cli/TeeSink.h"
+#include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/LogSinks.h"
 #include "host/RecordingFile.h"
@@ -29,7 +30,7 @@ namespace {
 bool endChild(ChildService& child) {
     child.stop();
     const std::string complaints = child.takeComplaints(); // lines that name the program
-    (void)!::write(STDERR_FILENO, complaints.data(), complaints.size());
+    passOnComplaints(complaints);
     return complaints.empty();
 }
 

@@ -6,6 +6,7 @@
 #include "cli/RequiredTemplates.h"
 #include "cli/ScopedLog.h"
 #include "host/BuildBundle.h"
+#include "host/Complaint.h"
 #include "host/LogSinks.h"
 #include "host/MonotonicClock.h"
 #include "host/RecordingFile.h"

@@ -15,12 +15,19 @@ namespace {
 
 constexpr std::string_view kHexDigits = "0123456789abcdef";
 constexpr unsigned char kFirstPrintable = 0x20;
+constexpr unsigned char kDelete = 0x7F;
 constexpr unsigned char kFirstBeyondAscii = 0x80;
+constexpr char32_t kFirstBehindC1 = 0xA0;
 
 bool isPlain(char character) {
     const auto byte = static_cast<unsigned char>(character);
-    return byte >= kFirstPrintable && byte < kFirstBeyondAscii && character != '"' &&
-           character != '\\';
+    return byte >= kFirstPrintable && byte < kDelete && character != '"' && character != '\\';
+}
+
+void appendEscapedControl(std::string& out, char32_t code) {
+    out += "\\u00";
+    out += kHexDigits[code >> 4U];
+    out += kHexDigits[code & 0xFU];
 }
 
 void appendEscapedAscii(std::string& out, char character) {
@@ -32,10 +39,7 @@ void appendEscapedAscii(std::string& out, char character) {
         out += kNames[named];
         return;
     }
-    const auto code = static_cast<unsigned char>(character);
-    out += "\\u00";
-    out += kHexDigits[code >> 4U];
-    out += kHexDigits[code & 0xFU];
+    appendEscapedControl(out, static_cast<unsigned char>(character));
 }
 
 void appendEscaped(std::string& out, std::string_view text) {
@@ -45,11 +49,15 @@ void appendEscaped(std::string& out, std::string_view text) {
             out += text.front();
         } else if (static_cast<unsigned char>(text.front()) < kFirstBeyondAscii) {
             appendEscapedAscii(out, text.front());
-        } else if (const std::size_t length = utf8At(text, 0).size; length > 0) {
-            out += text.substr(0, length);
-            taken = length;
-        } else {
+        } else if (const Utf8CodePoint character = utf8At(text, 0); character.size == 0) {
             out += kReplacementCharacter;
+        } else {
+            taken = character.size;
+            if (character.value < kFirstBehindC1) {
+                appendEscapedControl(out, character.value);
+            } else {
+                out += text.substr(0, taken);
+            }
         }
         text.remove_prefix(taken);
     }

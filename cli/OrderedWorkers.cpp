@@ -1,7 +1,7 @@
 #include "cli/OrderedWorkers.h"
 
 #include "cli/Output.h"
-#include "cli/Programs.h"
+#include "host/Complaint.h"
 #include "platform/Format.h"
 
 #include <algorithm>

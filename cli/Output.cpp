@@ -2,6 +2,7 @@
 
 #include "host/Interruption.h"
 #include "platform/Format.h"
+#include "platform/Printable.h"
 
 #include <cerrno>
 #include <system_error>
@@ -42,8 +43,16 @@ void Output::flush() {
 }
 
 Output::Write writeToDescriptor(int descriptor, std::string name) {
-    return [descriptor, name = std::move(name)](std::string_view block) {
-        writeWhole(descriptor, name, block);
+    if (::isatty(descriptor) == 0) {
+        return [descriptor, name = std::move(name)](std::string_view block) {
+            writeWhole(descriptor, name, block);
+        };
+    }
+    return [descriptor, name = std::move(name),
+            pieces = PrintablePieces()](std::string_view block) mutable {
+        std::string text;
+        pieces.append(text, block);
+        writeWhole(descriptor, name, text);
     };
 }
 

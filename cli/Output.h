@@ -47,9 +47,10 @@ private:
     std::string _taken; // the block being written; both keep their memory
 };
 
-/// Writes whole blocks to a file descriptor; throws OutputClosed when it is a pipe that nobody
-/// reads (SIGPIPE must be ignored) and when an Interruption is due, OutputFailure that names `name`
-/// otherwise.
+/// Writes whole blocks of text to a file descriptor; throws OutputClosed when it is a pipe that
+/// nobody reads (SIGPIPE must be ignored) and when an Interruption is due, OutputFailure that names
+/// `name` otherwise. A terminal gets what commands it as escapes (platform/Printable); files and
+/// pipes get the text as it is.
 Output::Write writeToDescriptor(int descriptor, std::string name);
 
 } // namespace pallax

@@ -2,9 +2,9 @@
 
 #include "app/HomeScreenPreference.h"
 #include "cli/Output.h"
-#include "cli/Programs.h"
 #include "cli/StampSentence.h"
 #include "cli/WaitNotice.h"
+#include "host/Complaint.h"
 #include "host/FilePreferences.h"
 
 #include <chrono>

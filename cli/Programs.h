@@ -3,9 +3,6 @@
 #include "cli/ExitStatus.h"
 #include "cli/Options.h"
 
-#include <string>
-#include <string_view>
-
 /// What the parsed command line runs: the parts of the system, wired to this machine. Each
 /// reports on standard error; OutputClosed, OutputFailure and FatalRecord leave.
 namespace pallax {
@@ -14,10 +11,5 @@ ExitStatus runDecode(const DecodeOptions& options);
 ExitStatus runBrowse(const BrowseOptions& options);
 ExitStatus runRecord(const RecordOptions& options);
 ExitStatus runSimulate(const SimulateOptions& options);
-
-/// "pallax: " and the sentence, on standard error.
-void complain(std::string_view sentence);
-/// The same for what WaitNotice says.
-void complainOfWaiting(const std::string& text);
 
 } // namespace pallax

@@ -4,6 +4,8 @@
 #include "cli/Settings.h"
 #include "cli/TeeSink.h"
 #include "cli/TerminalLine.h"
+#include "cli/WaitNotice.h"
+#include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/LogSinks.h"
 #include "platform/Format.h"

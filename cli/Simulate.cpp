@@ -1,6 +1,7 @@
 #include "cli/Programs.h"
 #include "cli/Progress.h"
 #include "cli/TerminalLine.h"
+#include "host/Complaint.h"
 #include "host/MonotonicClock.h"
 #include "telephony/simulator/SimulatedRecording.h"
 

@@ -1,5 +1,7 @@
 #include "cli/TerminalLine.h"
 
+#include "platform/Printable.h"
+
 #include <algorithm>
 #include <cstdio>
 #include <sys/ioctl.h>
@@ -23,11 +25,13 @@ void TerminalLine::show(std::string_view text) {
     if (!isPossible()) {
         return;
     }
-    const std::string_view fitting = text.substr(0, _columns - 1); // the last column may wrap
     std::string bytes = "\r";
-    bytes.append(fitting);
-    bytes.append(_shown - std::min(_shown, fitting.size()), ' ');
-    _shown = fitting.size();
+    appendPrintable(bytes, text);
+    bytes.resize(
+        std::min(bytes.size(), _columns)); // with the return, less the last, which may wrap
+    const std::size_t fitting = bytes.size() - 1;
+    bytes.append(_shown - std::min(_shown, fitting), ' ');
+    _shown = fitting;
     _write(bytes);
 }
 

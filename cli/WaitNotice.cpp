@@ -1,5 +1,7 @@
 #include "cli/WaitNotice.h"
 
+#include "host/Complaint.h"
+
 #include <utility>
 
 namespace pallax {
@@ -25,6 +27,12 @@ void WaitNotice::look() {
     if (text != _told) {
         _told = text;
         _setup.say(text);
+    }
+}
+
+void complainOfWaiting(const std::string& text) {
+    if (!text.empty()) {
+        complain(text + ".");
     }
 }
 

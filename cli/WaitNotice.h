@@ -39,4 +39,7 @@ private:
     std::unique_ptr<RepeatingTimer> _looks;
 };
 
+/// Says what a WaitNotice has to say on standard error.
+void complainOfWaiting(const std::string& text);
+
 } // namespace pallax

@@ -1,11 +1,11 @@
 #include "cli/FatalRecord.h"
 #include "cli/Output.h"
 #include "cli/Programs.h"
+#include "host/Complaint.h"
 #include "host/StandardDescriptors.h"
 #include "telephony/ChildService.h"
 
 #include <csignal>
-#include <cstdio>
 #include <exception>
 #include <string>
 #include <unistd.h>
@@ -29,8 +29,8 @@ struct Run {
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);
-        } else { // the status tells it, whether or not anybody reads why
-            (void)std::fwrite(end.text.data(), 1, end.text.size(), stderr);
+        } else {
+            passOnComplaints(end.text);
         }
         return end.status;
     }

@@ -12,9 +12,13 @@ namespace pallax {
 
 namespace {
 
-void writeTo(std::FILE* file, LogPriority priority, std::string_view text) {
-    const std::string line = logLine(priority, text);
-    (void)std::fwrite(line.data(), 1, line.size(), file); // a failure stays with the stream
+/// A failure stays with the stream.
+void writeTo(std::FILE* file, std::string_view lines) {
+    (void)std::fwrite(lines.data(), 1, lines.size(), file);
+}
+
+bool isTerminal(std::FILE* file) {
+    return ::isatty(::fileno(file)) != 0;
 }
 
 } // namespace
@@ -40,16 +44,15 @@ void SyslogSink::write(LogPriority priority, std::string_view text) {
     ::syslog(static_cast<int>(priority), "%.*s", length, text.data()); // NOLINT: syslog's way
 }
 
-StderrSink::StderrSink() : _isTerminal(::isatty(STDERR_FILENO) != 0) {}
+StderrSink::StderrSink() : _isTerminal(isTerminal(stderr)) {}
 
 void StderrSink::write(LogPriority priority, std::string_view text) {
-    if (!_isTerminal) {
-        writeTo(stderr, priority, text);
-        return;
-    }
+    const std::string line = logLine(priority, text);
     std::string harmless;
-    appendPrintableLines(harmless, text);
-    writeTo(stderr, priority, harmless);
+    if (_isTerminal) {
+        appendPrintableLines(harmless, line);
+    }
+    writeTo(stderr, _isTerminal ? harmless : line);
 }
 
 Result<std::unique_ptr<FileSink>, HostError> FileSink::create(const std::string& path) {
@@ -74,16 +77,22 @@ Result<std::unique_ptr<FileSink>, HostError> FileSink::onto(int descriptor) {
     return std::unique_ptr<FileSink>(new FileSink(file));
 }
 
+FileSink::FileSink(std::FILE* file) : _file(file), _isTerminal(isTerminal(file)) {}
+
 FileSink::~FileSink() {
     (void)std::fclose(_file);
 }
 
 void FileSink::write(LogPriority priority, std::string_view text) {
-    writeTo(_file, priority, text);
+    append(logLine(priority, text));
 }
 
 void FileSink::append(std::string_view lines) {
-    (void)std::fwrite(lines.data(), 1, lines.size(), _file);
+    std::string harmless;
+    if (_isTerminal) {
+        _pieces.append(harmless, lines);
+    }
+    writeTo(_file, _isTerminal ? harmless : lines);
 }
 
 bool FileSink::flush() {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/HostError.h"
+#include "platform/Printable.h"
 #include "platform/Result.h"
 #include "platform/SystemLog.h"
 
@@ -41,8 +42,8 @@ private:
     bool _isTerminal;
 };
 
-/// Lines in a file, which is emptied first. They are written through when the sink is destroyed
-/// and whenever the buffer is full.
+/// Lines in a file, which is emptied first; a terminal in its place gets what commands it as
+/// escapes. They are written through when the sink is destroyed and whenever the buffer is full.
 class FileSink final : public LogSink {
 public:
     static Result<std::unique_ptr<FileSink>, HostError> create(const std::string& path);
@@ -58,8 +59,10 @@ public:
     bool flush();
 
 private:
-    explicit FileSink(std::FILE* file) : _file(file) {}
+    explicit FileSink(std::FILE* file);
     std::FILE* _file;
+    bool _isTerminal;
+    PrintablePieces _pieces; ///< of what goes to a terminal
 };
 
 } // namespace pallax

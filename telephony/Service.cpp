@@ -1,10 +1,10 @@
 #include "telephony/Service.h"
 
 #include "host/AsioMainQueue.h"
+#include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/SocketMessagePorts.h"
 #include "platform/Format.h"
-#include "platform/Printable.h"
 #include "telephony/RecordingSource.h"
 #include "telephony/Relay.h"
 #include "telephony/ServiceStatus.h"
@@ -26,12 +26,6 @@ namespace pallax {
 namespace {
 
 constexpr std::string_view kAsFastAsTakenText = "max";
-
-void complain(const std::string& sentence) {
-    std::string harmless; // some name a port, which a client has chosen
-    appendPrintable(harmless, sentence);
-    (void)std::fprintf(stderr, "pallax: %s\n", harmless.c_str());
-}
 
 /// What is served: the technology, and the sources, one for each channel.
 struct Program {
@@ -61,8 +55,7 @@ Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueu
                        nullptr};
     }
     const auto open = [&options] {
-        return openKnownRecording({options.recording, options.inputName,
-                                   [](std::string_view told) { complain(std::string(told)); }});
+        return openKnownRecording({options.recording, options.inputName, complain});
     };
     auto recording = options.relay ? openStream({open, complain}) : open();
     if (!recording) {

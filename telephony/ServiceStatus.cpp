@@ -104,10 +104,12 @@ Result<ServiceStatus, HostError> askStatus(SocketMessagePorts& ports,
 }
 
 std::string statusText(const ServiceStatus& status) {
-    std::string text = formatText("Technology: %@\nUptime: %lld s\nPackets sent: %lld\n"
-                                  "Packets dropped: %lld\nClients: %zu\n",
-                                  {status.technology, status.uptimeSeconds, status.sent,
-                                   status.dropped, status.clients.size()});
+    std::string technology; // as the service sends it
+    appendPrintable(technology, status.technology);
+    std::string text = formatText(
+        "Technology: %@\nUptime: %lld s\nPackets sent: %lld\n"
+        "Packets dropped: %lld\nClients: %zu\n",
+        {technology, status.uptimeSeconds, status.sent, status.dropped, status.clients.size()});
     for (const ServiceStatus::Client& client : status.clients) {
         const char* state = client.isStreaming ? "streaming"
                             : client.sent > 0  ? "at the end"

@@ -62,8 +62,9 @@ TEST(DisplayJson, ADateThatIsoCannotHoldIsItsDescription) {
 
 TEST(DisplayJson, EscapesWhatJsonCannotHold) {
     EXPECT_EQ(json(PropertyList(std::string("a\"b\\c\n\t\r\b\f\x01\x1F\x7F", 13))),
-              "\"a\\\"b\\\\c\\n\\t\\r\\b\\f\\u0001\\u001f\x7F\"");
+              "\"a\\\"b\\\\c\\n\\t\\r\\b\\f\\u0001\\u001f\\u007f\"");
     EXPECT_EQ(json(PropertyList(std::string("\0", 1))), R"("\u0000")");
+    EXPECT_EQ(json("\u0080\u009B\u009F\u00A0"), "\"\\u0080\\u009b\\u009f\u00A0\"");
 }
 
 TEST(DisplayJson, KeepsUtf8AndReplacesEachInvalidByte) {

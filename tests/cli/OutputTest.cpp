@@ -5,9 +5,12 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <array>
 #include <chrono>
 #include <csignal>
 #include <fcntl.h>
+#include <pty.h>
 #include <unistd.h>
 
 namespace pallax {
@@ -70,6 +73,29 @@ TEST(Output, WhatNobodyTakesIsGivenUpOnceASignalAsksForTheEnd) {
     queue.run(); // it has heard of the signal
     ::close(pipe[0]);
     ::close(pipe[1]);
+}
+
+/// What comes out of a pseudo-terminal into which the blocks are written.
+std::string onTerminal(const std::vector<std::string>& blocks) {
+    int terminal = -1;
+    int program = -1;
+    EXPECT_EQ(::openpty(&terminal, &program, nullptr, nullptr, nullptr), 0);
+    Output output(writeToDescriptor(program, "Standard output"));
+    for (const std::string& block : blocks) {
+        output.text() += block;
+        output.flush();
+    }
+    std::array<char, 1000> read{};
+    const ssize_t length = ::read(terminal, read.data(), read.size());
+    ::close(program);
+    ::close(terminal);
+    return {read.data(), static_cast<std::size_t>(std::max<ssize_t>(length, 0))};
+}
+
+TEST(Output, ATerminalGetsWhatCommandsItAsEscapes) {
+    EXPECT_EQ(onTerminal({"\x1B]0;owned\a,\u009B2J\t\u202E\n\xFF"}),
+              "\\x1B]0;owned\\x07,\\u009B2J\t\\u202E\r\n\uFFFD");
+    EXPECT_EQ(onTerminal({"gr\xC3", "\xBC\xC2", "\x9Bn"}), "gr\u00FC\\u009Bn");
 }
 
 } // namespace

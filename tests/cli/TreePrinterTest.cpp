@@ -75,7 +75,7 @@ TEST_F(TreePrinterTest, TwoLeavesOfOneNameChangeOnTheirOwn) {
 
 TEST_F(TreePrinterTest, NoTextCommandsTheTerminal) {
     EXPECT_EQ(tick(Dictionary{{"SPN\n", "\x1B[2J\xFF\u009Bm Zürich"}}),
-              "== 2023-11-14 22:13:20 +0000\nSPN\uFFFD: \uFFFD[2J\uFFFD\uFFFDm Zürich\n");
+              "== 2023-11-14 22:13:20 +0000\nSPN\\x0A: \\x1B[2J\uFFFD\\u009Bm Zürich\n");
 }
 
 TEST_F(TreePrinterTest, WithoutATreeABlockIsItsHeader) {

@@ -4,6 +4,10 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <pty.h>
+#include <unistd.h>
+
 namespace pallax {
 namespace {
 
@@ -39,9 +43,29 @@ TEST(StderrSink, OnATerminalNoTextIsACommand) {
     testing::internal::CaptureStderr();
     StderrSink(true).write(LogPriority::Warning, "name:\t\x1B]0;owned\x07\n\x9B"
                                                  "31m \xC2\x9B gr\xC3\xBC\xC3\x9F");
-    EXPECT_EQ(testing::internal::GetCapturedStderr(), "<4>name:\t\xEF\xBF\xBD]0;owned\xEF\xBF\xBD\n"
+    EXPECT_EQ(testing::internal::GetCapturedStderr(), "<4>name:\t\\x1B]0;owned\\x07\n"
                                                       "\xEF\xBF\xBD"
-                                                      "31m \xEF\xBF\xBD gr\xC3\xBC\xC3\x9F\n");
+                                                      "31m \\u009B gr\xC3\xBC\xC3\x9F\n");
+}
+
+TEST(FileSink, ATerminalInItsPlaceGetsNoTextAsACommand) {
+    int terminal = -1;
+    int program = -1;
+    ASSERT_EQ(::openpty(&terminal, &program, nullptr, nullptr, nullptr), 0);
+    {
+        const auto sink = FileSink::onto(program);
+        ASSERT_TRUE(sink);
+        (*sink)->write(LogPriority::Warning, "name: \x1B]0;owned\x07");
+        (*sink)->append("<4>\xC2");
+        (*sink)->append("\x9B\n");
+        EXPECT_TRUE((*sink)->flush());
+    }
+    char read[100] = {};
+    const ssize_t length = ::read(terminal, read, sizeof read);
+    EXPECT_EQ(std::string(read, static_cast<std::size_t>(std::max<ssize_t>(length, 0))),
+              "<4>name: \\x1B]0;owned\\x07\r\n<4>\\u009B\r\n");
+    ::close(program);
+    ::close(terminal);
 }
 
 TEST(StderrSink, InAFileEveryByteStays) {

@@ -2,6 +2,7 @@
 
 #include "host/RecordingWriter.h"
 #include "platform/Printable.h"
+#include "platform/Utf8.h"
 #include "samples/Sample.h"
 #include "tests/reference/ReferenceFixture.h"
 
@@ -32,10 +33,18 @@ std::map<std::size_t, Json> decoded(const std::string& recording) {
     return displays;
 }
 
-/// A text in one line.
+/// A text as the analyser shows it: each control character replaced.
 std::string printable(const std::string& text) {
     std::string line;
-    appendPrintable(line, text);
+    for (std::size_t at = 0; at < text.size();) {
+        const Utf8CodePoint character = utf8At(text, at);
+        const bool isControl =
+            character.value < 0x20 || (character.value >= 0x7F && character.value < 0xA0);
+        const std::size_t size = std::max<std::size_t>(character.size, 1);
+        line += isControl || character.size == 0 ? kReplacementCharacter
+                                                 : std::string_view(text).substr(at, size);
+        at += size;
+    }
     return line;
 }
 

@@ -1,5 +1,6 @@
 #include "ui/terminal/TextWidth.h"
 
+#include "platform/Printable.h"
 #include "platform/Utf8.h"
 
 #include <algorithm>
@@ -11,8 +12,6 @@
 namespace pallax::terminal {
 
 namespace {
-
-constexpr std::string_view kReplacement = "\xEF\xBF\xBD"; // U+FFFD
 
 /// The calling thread's character type is UTF-8's for a scope, whatever the user's locale is.
 class Utf8CharacterType {
@@ -32,28 +31,25 @@ private:
     locale_t _previous;
 };
 
-/// Marks that would turn the direction of all that follows on the row.
-bool turnsDirection(char32_t codePoint) {
-    return (codePoint >= 0x202A && codePoint <= 0x202E) ||
-           (codePoint >= 0x2066 && codePoint <= 0x2069);
-}
-
-/// -1 for what cannot be shown.
+/// Of what does not command the terminal; -1 for what cannot be shown.
 int columnsOfCodePoint(char32_t codePoint) {
-    constexpr char32_t kFirstPrintable = 0x20;
-    constexpr char32_t kDelete = 0x7F;
-    if (codePoint < kDelete) {
-        return codePoint < kFirstPrintable ? -1 : 1;
-    }
-    if (turnsDirection(codePoint)) {
-        return -1;
-    }
-    return ::wcwidth(static_cast<wchar_t>(codePoint));
+    constexpr char32_t kFirstBeyondAscii = 0x80;
+    return codePoint < kFirstBeyondAscii ? 1 : ::wcwidth(static_cast<wchar_t>(codePoint));
 }
 
 bool isPlainAscii(std::string_view text) {
     return std::all_of(text.begin(), text.end(),
                        [](char byte) { return byte >= ' ' && byte < 0x7F; });
+}
+
+/// A cluster for each character of the escape, all of them standing for the same bytes.
+void addEscape(std::vector<Cluster>& clusters, char32_t codePoint, std::size_t at,
+               std::size_t size) {
+    std::string escape;
+    appendEscape(escape, codePoint);
+    for (const char character : escape) {
+        clusters.push_back({std::string(1, character), 1, at, size});
+    }
 }
 
 } // namespace
@@ -62,20 +58,25 @@ std::vector<Cluster> clustersOf(std::string_view text) {
     const Utf8CharacterType utf8;
     std::vector<Cluster> clusters;
     clusters.reserve(text.size());
+    bool canCombine = false; // with the last cluster
     for (std::size_t at = 0; at < text.size();) {
         const Utf8CodePoint codePoint = utf8At(text, at);
         const std::size_t size = std::max<std::size_t>(codePoint.size, 1);
+        const bool isEscaped = codePoint.size > 0 && commandsTerminal(codePoint.value);
         const int columns = codePoint.size == 0 ? -1 : columnsOfCodePoint(codePoint.value);
-        if (columns < 0) {
-            clusters.push_back({std::string(kReplacement), 1, at, size});
+        if (isEscaped) {
+            addEscape(clusters, codePoint.value, at, size);
+        } else if (columns < 0) {
+            clusters.push_back({std::string(kReplacementCharacter), 1, at, size});
         } else if (columns > 0) {
             clusters.push_back({std::string(text.substr(at, size)), columns, at, size});
-        } else if (clusters.empty()) {
+        } else if (!canCombine) {
             clusters.push_back({std::string(1, ' ').append(text.substr(at, size)), 1, at, size});
         } else {
             clusters.back().text += text.substr(at, size);
             clusters.back().bytes += size;
         }
+        canCombine = !isEscaped;
         at += size;
     }
     return clusters;

@@ -153,10 +153,10 @@ TEST(GridTest, FillRepeatsATextOverASpan) {
     EXPECT_EQ(grid.text(), "======\n ───\n");
 }
 
-TEST(GridTest, ControlCharactersAndBrokenBytesAreReplaced) {
-    Grid grid(9, 1);
-    EXPECT_EQ(grid.put(0, 0, "a\x1b[\n\xff\x7f\u009bz"), 8);
-    EXPECT_EQ(grid.text(), "a\uFFFD[\uFFFD\uFFFD\uFFFD\uFFFDz\n");
+TEST(GridTest, ControlCharactersAreEscapedAndBrokenBytesReplaced) {
+    Grid grid(24, 1);
+    EXPECT_EQ(grid.put(0, 0, "a\x1b[\n\xff\x7f\u009bz"), 22);
+    EXPECT_EQ(grid.text(), "a\\x1B[\\x0A\uFFFD\\x7F\\u009Bz\n");
 }
 
 TEST(GridTest, TheCursorIsWhereItWasSet) {

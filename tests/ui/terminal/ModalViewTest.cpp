@@ -156,11 +156,11 @@ TEST_F(ModalViewTest, WideCharactersInTheDescriptionKeepTheFrameStraight) {
     EXPECT_EQ(faultOf(draw()), "");
 }
 
-TEST_F(ModalViewTest, AnItemsControlCharactersAreReplaced) {
+TEST_F(ModalViewTest, AnItemsControlCharactersAreEscaped) {
     stage.saveHistory = Array{Dictionary{{"Description", "Esc\x1b[2J"}}};
     stage.type("s");
     stage.frontEnd.resize(40, 12);
-    EXPECT_EQ(stage.line(3), "│ ✓ Esc\uFFFD[2J                            │");
+    EXPECT_EQ(stage.line(3), "│ ✓ Esc\\x1B[2J                         │");
 }
 
 } // namespace

@@ -75,15 +75,16 @@ TEST_F(PaneViewTextTest, WhatAModemSendsNeverReachesTheScreenRaw) {
     openSection({{"Esc\x1b[2J", "\x07"
                                 "bell"},
                  {"Broken \xff\xc3", "\xe6\xbc"},
-                 {"C1 \u009b31m", "new\nline"}},
+                 {"C1 \u009b31m", "new\nline"},
+                 {"Turned \u202e", "\u200f"}},
                 "Odd\x1b]0;title\x07");
     EXPECT_EQ(stage.screen(40, 12), R"(
- Pallax › Odd�]0;title�
+ Pallax › Odd\x1B]0;title\x07
  ──────────────────────────────────────
-▌Esc�[2J                         �bell
+▌Esc\x1B[2J                   \x07bell
  Broken ��                          ��
- C1 �31m                      new�line
-
+ C1 \u009B31m              new\x0Aline
+ Turned \u202E                  \u200F
 
 
 

@@ -1,5 +1,6 @@
 #include "ui/terminal/TextWidth.h"
 
+#include "platform/Printable.h"
 #include "platform/Utf8.h"
 
 #include <gtest/gtest.h>
@@ -49,11 +50,25 @@ TEST(TextWidthTest, ACombiningCharacterWithoutOneBeforeItStandsOnABlank) {
     EXPECT_EQ(columnsOf("\u0301"), 1);
 }
 
-TEST(TextWidthTest, ControlCharactersAreReplacedOneEach) {
-    EXPECT_EQ(clustersOf("\x1b\t\x7f"),
-              (Clusters{{"\uFFFD", 1, 0, 1}, {"\uFFFD", 1, 1, 1}, {"\uFFFD", 1, 2, 1}}));
-    EXPECT_EQ(clustersOf(std::string_view("\0", 1)), (Clusters{{"\uFFFD", 1, 0, 1}}));
-    EXPECT_EQ(clustersOf("\u009b"), (Clusters{{"\uFFFD", 1, 0, 2}}));
+std::string joined(std::string_view text) {
+    std::string shown;
+    for (const Cluster& cluster : clustersOf(text)) {
+        shown += cluster.text;
+    }
+    return shown;
+}
+
+TEST(TextWidthTest, WhatCommandsATerminalIsEscaped) {
+    EXPECT_EQ(clustersOf("a\tb"), (Clusters{{"a", 1, 0, 1},
+                                            {"\\", 1, 1, 1},
+                                            {"x", 1, 1, 1},
+                                            {"0", 1, 1, 1},
+                                            {"9", 1, 1, 1},
+                                            {"b", 1, 2, 1}}));
+    EXPECT_EQ(joined(std::string_view("\0\x1b\x7f", 3)), "\\x00\\x1B\\x7F");
+    EXPECT_EQ(joined("\u009b\u061c\u200e\u202e\u2069"), "\\u009B\\u061C\\u200E\\u202E\\u2069");
+    EXPECT_EQ(columnsOf("\u202e"), 6);
+    EXPECT_EQ(joined("\x1b\u0301"), "\\x1B \u0301") << "it combines with no escape";
 }
 
 TEST(TextWidthTest, BrokenUtf8IsReplacedByteByByte) {
@@ -80,13 +95,16 @@ TEST(TextWidthTest, ClustersCoverAnyBytesWithPrintableTextOfOneOrTwoColumns) {
         std::size_t offset = 0;
         int columns = 0;
         for (const Cluster& cluster : clustersOf(bytes)) {
-            RC_ASSERT(cluster.offset == offset);
+            const bool isRestOfEscape = cluster.offset + cluster.bytes == offset;
+            RC_ASSERT(cluster.offset == offset || isRestOfEscape);
             RC_ASSERT(cluster.bytes > 0U);
             RC_ASSERT(cluster.columns == 1 || cluster.columns == 2);
             RC_ASSERT(!invalidUtf8At(cluster.text));
             RC_ASSERT(clustersOf(cluster.text).size() == 1U);
-            RC_ASSERT(static_cast<unsigned char>(cluster.text.front()) >= 0x20);
-            offset += cluster.bytes;
+            std::string printable;
+            appendPrintable(printable, cluster.text);
+            RC_ASSERT(printable == cluster.text);
+            offset = cluster.offset + cluster.bytes;
             columns += cluster.columns;
         }
         RC_ASSERT(offset == bytes.size());
