@@ -38,6 +38,10 @@ PropertyList LogGenerator::generateLogUsingState(Dictionary& /*state*/) {
     throw UnrecognisedOperation("generateLogUsingState:");
 }
 
+bool LogGenerator::keepsDisplay(const Dictionary& state) const {
+    return state.find("Display") != nullptr;
+}
+
 PropertyList LogGenerator::getStartCommand() const {
     throw UnrecognisedOperation("getStartCommand");
 }

@@ -58,14 +58,39 @@ void PallaxApp::applicationDidFinishLaunching() {
     _window->addView(*_navController);
     _window->makeKeyAndVisible();
 
-    // Connecting waits until the first screen is drawn.
-    _surroundings.queue.async(whileAlive(&PallaxApp::restartMonitor));
+    postRestart();
+}
+
+/// Connecting waits until the first screen is drawn.
+void PallaxApp::postRestart() {
+    if (!_isRestartPosted) {
+        _isRestartPosted = true;
+        _surroundings.queue.async(whileAlive(&PallaxApp::restartMonitor));
+    }
 }
 
 void PallaxApp::restartMonitor() {
+    _isRestartPosted = false;
     if (_model) {
         _model->restartMonitor();
     }
+}
+
+void PallaxApp::startAfresh() {
+    if (!_model) {
+        return;
+    }
+    _model.reset(); // the name of its port is free for the next one's
+    _model = _surroundings.makeModel(*this);
+    _displayAge = {};
+    _technology.clear();
+    setUpdateMessage(kNotConnected);
+    _navController->popTo(0, false);
+    PallaxPaneController& root = paneOf(*_navController->screens().front());
+    root.reloadWithNode(nullptr);
+    root.setStatus(kLaunching, true);
+    reportLink();
+    postRestart();
 }
 
 void PallaxApp::applicationWillTerminate() {
@@ -137,11 +162,28 @@ void PallaxApp::updateViewControllerFromModel() {
     if (!_navController) {
         return;
     }
+    _displayAge.shown(_surroundings.clock.now());
     reloadPanes();
     if (isConnected()) {
         setUpdateMessage(_dateFormatter->stringFromDate(_surroundings.clock.now()));
     }
     updateTopStatus();
+}
+
+void PallaxApp::generatorChosen(const std::string& technology, bool keepsDisplay) {
+    _technology = technology;
+    _displayAge.generatorChosen(keepsDisplay, _surroundings.clock.now());
+    if (keepsDisplay && _surroundings.startsAfreshByItself) {
+        _surroundings.queue.async(whileAlive(&PallaxApp::startAfresh)); // the model still works
+    } else {
+        reportLink();
+    }
+}
+
+void PallaxApp::reportLink() const {
+    if (_surroundings.linkChanged) {
+        _surroundings.linkChanged(_technology, _displayAge.left());
+    }
 }
 
 NodeRef PallaxApp::nodeOf(const PallaxPaneController& pane, std::size_t index) {

@@ -3,6 +3,7 @@
 #include "app/DateFormatter.h"
 #include "app/PallaxPaneController.h"
 #include "app/PallaxSaveViewController.h"
+#include "monitor/DisplayAge.h"
 #include "monitor/PallaxModel.h"
 #include "platform/ui/NavigationStack.h"
 #include "platform/ui/Window.h"
@@ -34,6 +35,11 @@ public:
     /// Makes the model, whose observer is the application object.
     using ModelMaker = std::function<std::unique_ptr<PallaxModel>(ModelObserver& observer)>;
 
+    /// Told what the modem speaks (nothing before it is known), and when the shown values came if a
+    /// restarted link has left them behind.
+    using LinkChanged =
+        std::function<void(const std::string& technology, const std::optional<Time>& valuesFrom)>;
+
     /// All that is referred to outlives the application object. The model's queue is this one.
     struct Surroundings {
         ui::Toolkit& toolkit;
@@ -45,6 +51,9 @@ public:
         ModelMaker makeModel;
         std::string snapshotDirectory = std::string(kSnapshotDirectory);
         std::string saveButtonMarker = std::string(kSaveButtonMarker);
+        /// When a restarted link leaves the display with its old values.
+        bool startsAfreshByItself = false;
+        LinkChanged linkChanged = {};
     };
 
     /// Starts nothing.
@@ -55,6 +64,9 @@ public:
 
     /// Shows the root pane and posts the model's first start to the queue.
     void applicationDidFinishLaunching();
+    /// Makes a new model in place of the old one, and shows the root pane as at the launch; a
+    /// snapshot screen that is open keeps what it holds. Not to be called by the model itself.
+    void startAfresh();
     /// To be called at every exit, once.
     void applicationWillTerminate();
 
@@ -71,6 +83,7 @@ public:
     /// Reloads every pane, or pops back to below the first whose path has vanished; then the
     /// status of the top pane.
     void updateViewControllerFromModel() override;
+    void generatorChosen(const std::string& technology, bool keepsDisplay) override;
     void navigationControllerWillShow(ui::NavigationStack& stack, ui::TableScreen& screen,
                                       bool animated) override;
 
@@ -101,6 +114,8 @@ private:
     /// A block for the queue that does nothing once the application object is gone.
     std::function<void()> whileAlive(void (PallaxApp::*action)());
     void restartMonitor();
+    void postRestart();
+    void reportLink() const;
 
     Surroundings _surroundings;
     std::unique_ptr<ui::NavigationStack> _navController;
@@ -110,6 +125,9 @@ private:
     std::unique_ptr<DateFormatter> _dateFormatter;
     std::optional<std::string> _updateMessage;
     bool _allowSaveButton = false;
+    bool _isRestartPosted = false;
+    std::string _technology;
+    DisplayAge _displayAge;
     std::shared_ptr<PallaxApp*> _alive;
 };
 

@@ -58,8 +58,8 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     bool isWhole = false;
     try {
-        PrintBrowser browser(std::move(directory), request.onFatalRecord, child, output,
-                             sourceName(request.options));
+        PrintBrowser browser(std::move(directory), request.onFatalRecord, child,
+                             request.settings.afterReconnect, output, sourceName(request.options));
         isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // what was printed, and the generators' last words

@@ -1,10 +1,13 @@
 #pragma once
 
 #include "cli/BrowseLink.h"
+#include "cli/Settings.h"
 #include "cli/TreePrinter.h"
+#include "monitor/DisplayAge.h"
 #include "monitor/PallaxModel.h"
 #include "platform/StandardOutput.h"
 
+#include <memory>
 #include <string>
 
 namespace pallax {
@@ -12,13 +15,13 @@ namespace pallax {
 class Output;
 
 /// Browses without a terminal: a model, and the printer that shows it.
-class PrintBrowser {
+class PrintBrowser final : private ModelObserver {
 public:
     /// `source` names what is browsed, for sentences about it.
     PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                 Output& output, std::string source);
+                 AfterReconnect afterReconnect, Output& output, std::string source);
     /// Whatever ended it: switches the home-screen preference off, as the application does.
-    ~PrintBrowser();
+    ~PrintBrowser() override;
     PrintBrowser(const PrintBrowser&) = delete;
     PrintBrowser& operator=(const PrintBrowser&) = delete;
 
@@ -37,14 +40,19 @@ private:
         Output& _output;
     };
 
+    void updateViewControllerFromModel() override;
+    void generatorChosen(const std::string& technology, bool keepsDisplay) override;
+    void start();
     void look();
 
     std::string _source;
+    AfterReconnect _afterReconnect;
+    DisplayAge _displayAge;
     bool _childLost = false;
     Notices _notices;
     BrowseLink _link;
     TreePrinter _printer;
-    PallaxModel _model;
+    std::unique_ptr<PallaxModel> _model;
 };
 
 } // namespace pallax

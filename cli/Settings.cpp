@@ -49,6 +49,13 @@ std::optional<std::string> take(Settings& settings, std::string_view key, std::s
                      : std::optional(formatText(
                            "system-log-level is a number from 0 to 7, not \"%@\"", {value}));
     }
+    if (key == "after-reconnect") {
+        if (value != "keep" && value != "fresh") {
+            return formatText("after-reconnect is \"keep\" or \"fresh\", not \"%@\"", {value});
+        }
+        settings.afterReconnect = value == "fresh" ? AfterReconnect::Fresh : AfterReconnect::Keep;
+        return std::nullopt;
+    }
     if (key != "snapshot-directory" && key != "save-button-marker") {
         return formatText("there is no setting \"%@\"", {key});
     }

@@ -12,13 +12,17 @@
 
 namespace pallax {
 
+/// What becomes of the display when the link to the modem was restarted.
+enum class AfterReconnect { Keep, Fresh };
+
 /// What the settings file says; without one, the defaults hold. Lines are `key = value`, empty,
 /// or a comment from "#" on its own line.
 struct Settings {
-    OnFatalRecord onFatalRecord = OnFatalRecord::Stop; ///< on-fatal-record = stop | skip
-    std::optional<std::string> snapshotDirectory;      ///< snapshot-directory = PATH
-    std::optional<std::string> saveButtonMarker;       ///< save-button-marker = PATH
-    int systemLogLevel = kSyslogLevel;                 ///< system-log-level = 0 ... 7
+    AfterReconnect afterReconnect = AfterReconnect::Keep; ///< after-reconnect = keep | fresh
+    OnFatalRecord onFatalRecord = OnFatalRecord::Stop;    ///< on-fatal-record = stop | skip
+    std::optional<std::string> snapshotDirectory;         ///< snapshot-directory = PATH
+    std::optional<std::string> saveButtonMarker;          ///< save-button-marker = PATH
+    int systemLogLevel = kSyslogLevel;                    ///< system-log-level = 0 ... 7
 };
 
 /// One clear sentence that names file and line.

@@ -32,6 +32,11 @@ public:
         : _output(output), _clock(clock), _nodes(std::move(nodes)) {}
 
     void updateViewControllerFromModel() override;
+    /// The next block is a first one.
+    void startAfresh() {
+        _hasPrinted = false;
+        _values.clear();
+    }
     /// To be told now and then: prints "Connecting..." once each time there is no connection.
     void showConnection(bool isConnected);
 

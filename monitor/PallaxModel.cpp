@@ -191,6 +191,11 @@ void PallaxModel::configureGenerator() {
     _logGenerator = LogGenerator::generatorFromTechnology(technology, _platform.technologies,
                                                           _platform.generators);
     logError("Got log generated: %p", static_cast<const void*>(_logGenerator.get()));
+    if (_logGenerator) {
+        std::string name;
+        (void)technology.appendString(name);
+        _platform.observer.generatorChosen(name, _logGenerator->keepsDisplay(_state));
+    }
 }
 
 bool PallaxModel::isConnected() const {

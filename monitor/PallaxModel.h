@@ -10,6 +10,7 @@
 #include <chrono>
 #include <memory>
 #include <span>
+#include <string>
 #include <string_view>
 
 namespace pallax {
@@ -23,6 +24,9 @@ public:
     virtual ~ModelObserver() = default;
     /// New data has arrived since the last display tick; called on the main queue.
     virtual void updateViewControllerFromModel() = 0;
+    /// A generator for what the modem speaks is in place. `keepsDisplay`: after a restart of the
+    /// link the display keeps its values, whatever arrives from now on.
+    virtual void generatorChosen(const std::string& /*technology*/, bool /*keepsDisplay*/) {}
 };
 
 /// The spine of the system: owns the link to the baseband, chooses the log generator, feeds it

@@ -166,6 +166,10 @@ PropertyList C2KLogGenerator::generateLogUsingState(Dictionary& state) {
     return display;
 }
 
+bool C2KLogGenerator::keepsDisplay(const Dictionary& state) const {
+    return ZORLogGenerator::keepsDisplay(state) && dictionaryUnder("Lookup", state) == nullptr;
+}
+
 std::vector<CodeDescription> C2KLogGenerator::describe() {
     std::vector<CodeDescription> description;
     description.reserve(kParsers.size());

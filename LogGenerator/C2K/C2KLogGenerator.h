@@ -34,6 +34,8 @@ public:
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
     void catchUp() override;
+    /// Not where the state also holds the places of its values, which an earlier one has left.
+    bool keepsDisplay(const Dictionary& state) const override;
     PropertyList getStartCommand() const override;
 
     /// Adds a template's rows to a display and their places to a lookup table.

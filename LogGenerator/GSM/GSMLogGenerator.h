@@ -44,6 +44,8 @@ public:
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
     void catchUp() override;
+    /// Every message is the whole display.
+    bool keepsDisplay(const Dictionary& /*state*/) const override { return false; }
     PropertyList getStartCommand() const override;
     PropertyList getSaveContentsFromState(const Dictionary& state) const override;
 

@@ -70,6 +70,8 @@ protected:
         if (!saveButtonMarker.empty()) {
             surroundings.saveButtonMarker = saveButtonMarker;
         }
+        surroundings.startsAfreshByItself = startsAfresh;
+        surroundings.linkChanged = linkChanged;
         app = std::make_unique<PallaxApp>(std::move(surroundings));
     }
     /// Launches the application and lets it connect.
@@ -137,6 +139,8 @@ protected:
     std::span<const Technology> spoken = kFakeTechnologies;
     std::string snapshotDirectory; ///< empty: the built-in default
     std::string saveButtonMarker;  ///< empty: the built-in default
+    bool startsAfresh = false;     ///< by itself
+    PallaxApp::LinkChanged linkChanged;
     PallaxModel* appModel = nullptr;
     std::unique_ptr<PallaxApp> app;
 

@@ -4,6 +4,8 @@
 
 #include <algorithm>
 #include <csignal>
+#include <filesystem>
+#include <fstream>
 #include <regex>
 #include <sstream>
 
@@ -69,6 +71,12 @@ std::vector<std::string> linesFrom(const std::string& log, const std::string& te
     return lines;
 }
 
+/// The time of the last block that is printed.
+std::string lastTick(const std::string& printed) {
+    const std::size_t at = printed.rfind("== ") + 3;
+    return printed.substr(at, printed.find('\n', at) - at);
+}
+
 TEST_F(EndToEndReconnect, AfterAKilledServiceTheViewerTriesAgain5SecondsLaterAndItsDisplayStays) {
     PallaxProcess service(world, serviceOf("first.pcap", 2));
     EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
@@ -92,7 +100,10 @@ TEST_F(EndToEndReconnect, AfterAKilledServiceTheViewerTriesAgain5SecondsLaterAnd
                   "<3> ***** Created ports (send=0xADDRESS, recv=0xADDRESS)",
                   "<3>Creating ZOR_GSMLogGenerator object",
                   "<3>Creating ZORLogGenerator2 object with 0xADDRESS", "<3>Class Index: 1",
-                  "<3>Got log generated: 0xADDRESS", "<3>Starting the display update timer"}));
+                  "<3>Got log generated: 0xADDRESS",
+                  "pallax: The link was restarted: values from before " + lastTick(before) +
+                      " stay on display (after-reconnect = fresh in pallax.conf starts afresh).",
+                  "<3>Starting the display update timer"}));
 
     // In between nothing is shown; then the display, which has kept the values of the first.
     EXPECT_TRUE(eventually([&] {
@@ -106,6 +117,23 @@ TEST_F(EndToEndReconnect, AfterAKilledServiceTheViewerTriesAgain5SecondsLaterAnd
         << since;
     EXPECT_EQ(since.find("INACTIVE"), std::string::npos) << since;
     EXPECT_EQ(since.find('*'), std::string::npos) << "nothing has changed\n" << since;
+    end(viewer);
+    end(again);
+}
+
+TEST_F(EndToEndReconnect, WhereTheSettingSaysSoTheDisplayStartsAfreshAfterAReconnect) {
+    std::filesystem::create_directories(world.path("config/pallax"));
+    std::ofstream(world.path("config/pallax/pallax.conf")) << "after-reconnect = fresh\n";
+    PallaxProcess service(world, serviceOf("first.pcap", 2));
+    EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
+    PallaxProcess viewer(world, {"--print"});
+    EXPECT_TRUE(viewer.says("  MM Service State: REG_STATE_REGISTERING\n"));
+    end(service);
+    EXPECT_TRUE(viewer.says("Connecting...\n"));
+    PallaxProcess again(world, serviceOf("second.pcap", 0));
+    EXPECT_TRUE(viewer.says("  MM Service State: REG_STATE_INACTIVE\n"));
+    EXPECT_EQ(viewer.err(), "pallax: The link was restarted: the display starts afresh.\n");
+    EXPECT_EQ(viewer.out().find('*'), std::string::npos) << "its first block is a first one";
     end(viewer);
     end(again);
 }

@@ -24,6 +24,7 @@ TEST(Settings, AreReadLineByLine) {
                                         "  on-fatal-record =  skip \r\n"
                                         "snapshot-directory=/tmp/a = b\n"
                                         "system-log-level = 4\n"
+                                        "after-reconnect = fresh\n"
                                         "save-button-marker = /tmp/marker",
                                         "pallax.conf");
     ASSERT_TRUE(settings);
@@ -31,6 +32,9 @@ TEST(Settings, AreReadLineByLine) {
     EXPECT_EQ(settings->snapshotDirectory, "/tmp/a = b");
     EXPECT_EQ(settings->saveButtonMarker, "/tmp/marker");
     EXPECT_EQ(settings->systemLogLevel, 4);
+    EXPECT_EQ(settings->afterReconnect, AfterReconnect::Fresh);
+    EXPECT_EQ(parseSettings("after-reconnect = keep", "pallax.conf")->afterReconnect,
+              AfterReconnect::Keep);
 }
 
 TEST(Settings, WithoutAFileTheDefaultsHold) {
@@ -40,6 +44,7 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
     EXPECT_EQ(settings->snapshotDirectory, std::nullopt);
     EXPECT_EQ(settings->saveButtonMarker, std::nullopt);
     EXPECT_EQ(settings->systemLogLevel, 3);
+    EXPECT_EQ(settings->afterReconnect, AfterReconnect::Keep);
 }
 
 TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
@@ -47,6 +52,8 @@ TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
               "pallax.conf, line 3: there is no setting \"colour\".");
     EXPECT_EQ(sentenceFor("on-fatal-record = maybe"),
               "pallax.conf, line 1: on-fatal-record is \"stop\" or \"skip\", not \"maybe\".");
+    EXPECT_EQ(sentenceFor("after-reconnect = never"),
+              "pallax.conf, line 1: after-reconnect is \"keep\" or \"fresh\", not \"never\".");
     EXPECT_EQ(sentenceFor("snapshot-directory ="),
               "pallax.conf, line 1: snapshot-directory needs a path.");
     for (const char* level : {"8", "-1", "4x", "", "warning", "99999999999"}) {

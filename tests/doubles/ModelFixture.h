@@ -21,12 +21,16 @@ class CountingObserver final : public ModelObserver {
 public:
     int updates = 0;
     std::function<void()> onUpdate;
+    std::vector<std::string> generators; ///< "Fake", or "Fake, keeps the display"
 
     void updateViewControllerFromModel() override {
         ++updates;
         if (onUpdate) {
             onUpdate();
         }
+    }
+    void generatorChosen(const std::string& technology, bool keepsDisplay) override {
+        generators.push_back(technology + (keepsDisplay ? ", keeps the display" : ""));
     }
 };
 

@@ -150,6 +150,24 @@ TEST_F(PallaxModelLifecycleTest, ARecordsExceptionLeavesThroughTheQueueAndSetsNo
     EXPECT_EQ(observer.updates, 1);
 }
 
+TEST_F(PallaxModelLifecycleTest, TheObserverIsToldOfEachGeneratorAndOfADisplayThatItKeeps) {
+    using Told = std::vector<std::string>;
+    start();
+    EXPECT_EQ(observer.generators, Told{"Fake"});
+    ports.endLocal();
+    EXPECT_EQ(observer.generators, (Told{"Fake", "Fake"})) << "there was no display";
+    generator().display = Dictionary{{"SIM", "1"}};
+    (void)model->topLevelNodes();
+    ports.endLocal();
+    EXPECT_EQ(observer.generators, (Told{"Fake", "Fake", "Fake, keeps the display"}));
+    reply = technology("Unknown");
+    ports.endLocal();
+    EXPECT_EQ(observer.generators.size(), 3U) << "no generator is in place";
+    reply = {SendError::ReplyTimedOut, std::nullopt};
+    queue.advance(PallaxModel::kRetryDelay);
+    EXPECT_EQ(observer.generators.size(), 3U);
+}
+
 TEST_F(PallaxModelLifecycleTest, TheStateSurvivesRestarts) {
     start();
     generator().display = Dictionary{{"Serving", "1"}};
