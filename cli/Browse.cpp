@@ -17,6 +17,7 @@
 #include "ui/terminal/TerminalRestorer.h"
 
 #include <algorithm>
+#include <filesystem>
 #include <memory>
 #include <stdexcept>
 #include <unistd.h>
@@ -69,6 +70,19 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     return isWhole;
 }
 
+ScreenBrowser::Source sourceOf(const BrowseOptions& options) {
+    if (options.simulation) {
+        return {"simulated " + std::string(options.simulation->technology->commandName)};
+    }
+    if (!options.recording) {
+        return {"live modem"};
+    }
+    if (options.recording == "-") {
+        return {"standard input", true};
+    }
+    return {std::filesystem::path(*options.recording).filename().string()};
+}
+
 /// As `browseInPrint`. The terminal is restored by the time anything else is told.
 bool browseOnScreen(const Request& request, SocketDirectory directory, ChildService* child) {
     KeptNotices notices(writeToDescriptor(STDOUT_FILENO, "Standard output"));
@@ -76,8 +90,8 @@ bool browseOnScreen(const Request& request, SocketDirectory directory, ChildServ
     if (!terminal) {
         throw std::runtime_error(terminal.error().sentence);
     }
-    ScreenBrowser browser(std::move(directory), request.onFatalRecord, child, request.settings,
-                          **terminal, notices);
+    ScreenBrowser browser(std::move(directory), request.onFatalRecord, child,
+                          sourceOf(request.options), request.settings, **terminal, notices);
     return browser.run();
 }
 

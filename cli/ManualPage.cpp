@@ -2,6 +2,7 @@
 
 #include "cli/HelpText.h"
 #include "platform/Roff.h"
+#include "ui/terminal/KeyHelp.h"
 
 #include <utility>
 
@@ -113,6 +114,15 @@ std::string commandsOf(const CommandDescription& program) {
     return list;
 }
 
+/// What the help of the screen lists.
+std::string keysOnScreen() {
+    std::string list = ".SH KEYS\n";
+    for (const terminal::KeyHelp& help : terminal::keyHelp()) {
+        list += ".TP\n" + roffBold(help.keys) + "\n" + sentence(std::string(help.meaning));
+    }
+    return list;
+}
+
 std::string seeAlso(const CommandDescription& program, const CommandDescription* command) {
     std::string list = ".SH SEE ALSO\n";
     if (command != nullptr) {
@@ -157,6 +167,7 @@ std::string page(const CommandDescription& program, const CommandDescription* co
     text += listOf("OPTIONS", subject.options);
     if (command == nullptr) {
         text += commandsOf(program);
+        text += keysOnScreen();
     }
     text += ".SH EXAMPLES\n.EX\n" + roffText(help.examples) + "\n.EE\n";
     text += exitStatus(help.statuses);

@@ -3,6 +3,7 @@
 #include "cli/Settings.h"
 #include "cli/StampSentence.h"
 #include "cli/WaitNotice.h"
+#include "cli/ZoneText.h"
 
 #include <chrono>
 #include <csignal>
@@ -26,22 +27,46 @@ bool ScreenBrowser::Files::writePropertyList(const std::string& path, const Prop
 }
 
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
-                             ChildService* child, const Settings& settings,
+                             ChildService* child, Source source, const Settings& settings,
                              terminal::CursesTerminal& terminal, StandardOutput& notices)
-    : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, notices),
+    : _source(std::move(source)), _terminal(terminal),
+      _link(std::move(directory), onFatalRecord, child, notices),
       _keys(_link.queue(), terminal.inputDescriptor()),
-      _frontEnd({[this] { needsDisplay(); }, [this] { _link.queue().stop(); },
-                 [this](const std::string& text) { _terminal.copy(text); },
-                 [this] {
-                     _terminal.repaint();
-                     needsDisplay();
-                 }},
-                terminal.marks()),
-      _files(_frontEnd), _preferences(FilePreferences::userFolder()),
-      _app(applicationSurroundings(settings)) {}
+      _frontEnd(frontEndSurroundings(), terminal.marks()), _files(_frontEnd),
+      _preferences(FilePreferences::userFolder()), _app(applicationSurroundings(settings)) {
+    _frontEnd.setOrigin({"", _source.name});
+}
 
 ScreenBrowser::~ScreenBrowser() {
     _app.applicationWillTerminate();
+}
+
+terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
+    return {.needsDisplay = [this] { needsDisplay(); },
+            .quit = [this] { _link.queue().stop(); },
+            .copy = [this](const std::string& text) { _terminal.copy(text); },
+            .repaint =
+                [this] {
+                    _terminal.repaint();
+                    needsDisplay();
+                },
+            .startAfresh = [this] { startAfresh(); },
+            .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); }};
+}
+
+void ScreenBrowser::startAfresh() {
+    if (_source.isReadOnce) {
+        return _frontEnd.setMessage("Standard input can be played only once");
+    }
+    _frontEnd.setNote(""); // of what was played until now
+    _app.startAfresh();
+}
+
+void ScreenBrowser::linkChanged(const std::string& technology,
+                                const std::optional<Time>& valuesFrom) {
+    _frontEnd.setOrigin({technology, _source.name});
+    const DateFormatter time("HH:mm:ss", _link.clock());
+    _frontEnd.setOldValues(valuesFrom ? time.stringFromDate(*valuesFrom) : "");
 }
 
 PallaxApp::Surroundings ScreenBrowser::applicationSurroundings(const Settings& settings) {
@@ -57,6 +82,10 @@ PallaxApp::Surroundings ScreenBrowser::applicationSurroundings(const Settings& s
                                              _model = model.get();
                                              return model;
                                          }};
+    surroundings.startsAfreshByItself = settings.afterReconnect == AfterReconnect::Fresh;
+    surroundings.linkChanged = [this](const auto& technology, const auto& valuesFrom) {
+        linkChanged(technology, valuesFrom);
+    };
     if (settings.snapshotDirectory) {
         surroundings.snapshotDirectory = *settings.snapshotDirectory;
     }

@@ -9,6 +9,7 @@
 
 #include <memory>
 #include <optional>
+#include <string>
 
 namespace pallax {
 
@@ -17,10 +18,16 @@ struct Settings;
 /// The application on the terminal that the process runs in.
 class ScreenBrowser {
 public:
+    /// Where the packets come from.
+    struct Source {
+        std::string name; ///< as the title shows it
+        bool isReadOnce = false;
+    };
+
     /// The terminal outlives the browser, so that an error is told on a restored one. So do the
     /// notices, which are to be printed there.
     ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                  const Settings& settings, terminal::CursesTerminal& terminal,
+                  Source source, const Settings& settings, terminal::CursesTerminal& terminal,
                   StandardOutput& notices);
     /// Whatever ended it: the application terminates as it is to at every exit.
     ~ScreenBrowser();
@@ -44,6 +51,9 @@ private:
     };
 
     PallaxApp::Surroundings applicationSurroundings(const Settings& settings);
+    terminal::FrontEnd::Surroundings frontEndSurroundings();
+    void startAfresh();
+    void linkChanged(const std::string& technology, const std::optional<Time>& valuesFrom);
     void waitForKey();
     void readKey();
     void needsDisplay();
@@ -52,6 +62,7 @@ private:
     void adoptSize();
     void look();
 
+    Source _source;
     bool _childLost = false;
     const PallaxModel* _model = nullptr; // the application's
     bool _isDisplayPosted = false;

@@ -4,6 +4,7 @@
 #include "cli/HelpText.h"
 #include "tests/doubles/Files.h"
 #include "tests/doubles/Shell.h"
+#include "ui/terminal/KeyHelp.h"
 
 #include <gtest/gtest.h>
 
@@ -66,6 +67,21 @@ TEST(ManualPage, EveryOptionIsOnItsPageWithItsValueAndDescription) {
                 << page;
         }
     }
+}
+
+TEST(ManualPage, TheProgramsListsTheKeysOfTheScreensHelp) {
+    const std::string page = plain(manualPage(program(), "pallax"));
+    const std::size_t keys = page.find(".SH KEYS\n");
+    const std::size_t behind = page.find(".SH EXAMPLES\n");
+    ASSERT_LT(keys, behind);
+    ASSERT_NE(behind, std::string::npos);
+    std::string listed = ".SH KEYS\n";
+    for (const terminal::KeyHelp& help : terminal::keyHelp()) {
+        listed.append(".TP\n").append(help.keys).append("\n").append(help.meaning).append(".\n");
+    }
+    EXPECT_EQ(page.substr(keys, behind - keys), listed);
+    EXPECT_NE(listed.find(".TP\n/\nfilter rows by name or value.\n"), std::string::npos);
+    EXPECT_EQ(plain(manualPage(program(), "pallax-decode")).find("KEYS"), std::string::npos);
 }
 
 TEST(ManualPage, TheProgramWritesIt) {

@@ -12,29 +12,6 @@ namespace {
 
 constexpr int kScrollColumns = 8; // at a key, of a row that does not fit
 
-/// By how many lines a key scrolls the help page, which shows `rows` of them; 0 for another key.
-int helpScroll(const KeyEvent& event, int rows) {
-    constexpr int kWheelLines = 3;
-    switch (event.key) {
-    case Key::Up:
-        return -1;
-    case Key::Down:
-        return 1;
-    case Key::PageUp:
-        return -rows;
-    case Key::PageDown:
-        return rows;
-    case Key::WheelUp:
-        return -kWheelLines;
-    case Key::WheelDown:
-        return kWheelLines;
-    case Key::Character:
-        return event.character == U'j' ? 1 : event.character == U'k' ? -1 : 0;
-    default:
-        return 0;
-    }
-}
-
 } // namespace
 
 FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
@@ -64,13 +41,20 @@ Grid FrontEnd::draw() {
     }
     endFilterOfOtherPane();
     const LineEditor* editor = _filterEditor ? &*_filterEditor : nullptr;
-    PaneView(grid, _marks, _hits).draw(*navigation, {_spinnerTurn, editor, _message, _note});
+    PaneView(grid, _marks, _hits)
+        .draw(*navigation, {.spinnerTurn = _spinnerTurn,
+                            .filterEditor = editor,
+                            .message = _message,
+                            .note = _note,
+                            .origin = _origin,
+                            .oldValues = _oldValues,
+                            .zone = _surroundings.zone(),
+                            .press = [this](const KeyEvent& event) { handle(event); }});
     if (const auto& modal = navigation->modal()) {
         ModalView(grid, _marks, _hits).draw(*modal, _modalFocus);
     }
-    if (_isHelpShown) {
-        _helpRows = drawHelp(grid, _marks, _helpFirst);
-        _helpFirst = std::min(_helpFirst, lastHelpFirst()); // there may be more room than before
+    if (_help.isOpen()) {
+        _help.draw(grid, _marks);
     }
     if (const ui::Alert* alert = _toolkit.alert()) {
         drawAlert(grid, _marks, *alert);
@@ -85,6 +69,16 @@ void FrontEnd::setMessage(std::string message) {
 
 void FrontEnd::setNote(std::string note) {
     _note = std::move(note);
+    needsDisplay();
+}
+
+void FrontEnd::setOrigin(Origin origin) {
+    _origin = std::move(origin);
+    needsDisplay();
+}
+
+void FrontEnd::setOldValues(std::string time) {
+    _oldValues = std::move(time);
     needsDisplay();
 }
 
@@ -119,8 +113,9 @@ void FrontEnd::handle(const KeyEvent& event) {
     }
     if (_toolkit.alert() != nullptr) {
         handleAlert(event);
-    } else if (_isHelpShown) {
-        handleHelp(event);
+    } else if (_help.isOpen()) {
+        _help.handle(event);
+        needsDisplay();
     } else if (event.key == Key::Click || event.key == Key::WheelUp ||
                event.key == Key::WheelDown) {
         handleMouse(event);
@@ -157,18 +152,6 @@ void FrontEnd::handleAlert(const KeyEvent& event) {
     if (closes) {
         _toolkit.closeAlert();
     }
-}
-
-int FrontEnd::lastHelpFirst() const {
-    return std::max(static_cast<int>(helpLines(_toolkit.columns()).size()) - _helpRows, 0);
-}
-
-/// The arrows scroll where the page does not fit; any other key closes it.
-void FrontEnd::handleHelp(const KeyEvent& event) {
-    const int lines = helpScroll(event, _helpRows);
-    _helpFirst = std::clamp(_helpFirst + lines, 0, lastHelpFirst());
-    _isHelpShown = lines != 0;
-    needsDisplay();
 }
 
 void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
@@ -277,9 +260,10 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
     case U'y':
         return copyValue(pane);
     case U'?':
-        _isHelpShown = true;
-        _helpFirst = 0;
+        _help.open();
         return needsDisplay();
+    case U'R':
+        return _surroundings.startAfresh();
     case U'q':
         return _toolkit.navigation()->isAtRoot() ? _surroundings.quit()
                                                  : _toolkit.navigation()->back();
@@ -339,7 +323,11 @@ void FrontEnd::escape(TerminalTable& table) {
 void FrontEnd::save() {
     const ui::SaveButton* button = saveButtonOf(_toolkit.navigation()->top().toolbarItems());
     if (button == nullptr) {
-        return setMessage("Saving is not enabled here");
+        return _toolkit.showAlert(
+            {"Saving is not enabled here",
+             "Two settings in pallax.conf enable it: snapshot-directory, where snapshots go, and "
+             "save-button-marker, a path that exists.",
+             "Close"});
     }
     const auto action = button->action; // a copy, for the items may be replaced
     action();

@@ -1,11 +1,13 @@
 #pragma once
 
 #include "ui/terminal/Grid.h"
+#include "ui/terminal/HelpPage.h"
 #include "ui/terminal/HitMap.h"
 #include "ui/terminal/Keys.h"
 #include "ui/terminal/LineEditor.h"
 #include "ui/terminal/Marks.h"
 #include "ui/terminal/ModalView.h"
+#include "ui/terminal/Origin.h"
 #include "ui/terminal/TerminalToolkit.h"
 
 #include <functional>
@@ -25,6 +27,9 @@ public:
         std::function<void()> quit;
         std::function<void(const std::string&)> copy; ///< to the clipboard
         std::function<void()> repaint;                ///< the terminal may show something else
+        std::function<void()> startAfresh = [] {};
+        /// The offset of the status text's time: "+0200".
+        std::function<std::string()> zone = [] { return std::string(); };
     };
 
     FrontEnd(Surroundings surroundings, const Marks& marks);
@@ -41,6 +46,12 @@ public:
     /// A few words behind the status text, from now on.
     void setNote(std::string note);
 
+    /// What the values come from.
+    void setOrigin(Origin origin);
+    /// A restarted link has left the values behind, which are from before `time` ("22:13:30"); with
+    /// an empty text, they follow the modem.
+    void setOldValues(std::string time);
+
     /// Whether something on the screen turns, so that `turn` is to be called now and then.
     bool isAnimated() const;
     void turn();
@@ -49,9 +60,6 @@ private:
     void needsDisplay();
     void handleMouse(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
-    void handleHelp(const KeyEvent& event);
-    /// The line at which the help page begins when it is scrolled to its end.
-    int lastHelpFirst() const;
     void handleModal(ui::ModalScreen& screen, const KeyEvent& event);
     void handleFilter(TerminalTable& table, const KeyEvent& event);
     void handlePane(const KeyEvent& event);
@@ -73,13 +81,13 @@ private:
     HitMap _hits;
     TerminalToolkit _toolkit;
     ModalFocus _modalFocus = ModalFocus::Save;
-    bool _isHelpShown = false;
-    int _helpFirst = 0;
-    int _helpRows = 0;                            ///< that fitted at the last drawing
+    HelpPage _help;
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
     std::weak_ptr<ui::TableScreen> _filteredPane; ///< whose it is
     std::optional<std::string> _message;
     std::string _note;
+    Origin _origin;
+    std::string _oldValues;
     std::size_t _spinnerTurn = 0;
 };
 

@@ -12,7 +12,10 @@ struct Marks {
     std::string_view disclosure; ///< behind a row that opens
     std::string_view changed;    ///< behind a value that the last tick changed
     std::string_view more;       ///< where a text goes on beyond the edge
+    std::string_view up;         ///< before the number of rows above the window
+    std::string_view down;       ///< before that of the rows below it
     std::string_view crumb;      ///< between the panes of the way here
+    std::string_view dot;        ///< between technology and source
     std::string_view check;
     std::string_view horizontal;
     std::string_view vertical;
@@ -23,10 +26,40 @@ struct Marks {
     std::array<std::string_view, 4> spinner;
 };
 
-inline constexpr Marks kUtf8Marks{false, "▌", "›", "*", "…", " › ", "✓",
-                                  "─",   "│", "┌", "┐", "└", "┘",   {"⠋", "⠹", "⠴", "⠧"}};
+inline constexpr Marks kUtf8Marks{false,
+                                  "▌",
+                                  "›",
+                                  "*",
+                                  "…",
+                                  "↑",
+                                  "↓",
+                                  " › ",
+                                  " · ",
+                                  "✓",
+                                  "─",
+                                  "│",
+                                  "┌",
+                                  "┐",
+                                  "└",
+                                  "┘",
+                                  {"⠋", "⠹", "⠴", "⠧"}};
 
-inline constexpr Marks kAsciiMarks{true, ">", ">", "*", "~", " > ", "x",
-                                   "-",  "|", "+", "+", "+", "+",   {"|", "/", "-", "\\"}};
+inline constexpr Marks kAsciiMarks{true,
+                                   ">",
+                                   ">",
+                                   "*",
+                                   "~",
+                                   "^",
+                                   "v",
+                                   " > ",
+                                   ", ",
+                                   "x",
+                                   "-",
+                                   "|",
+                                   "+",
+                                   "+",
+                                   "+",
+                                   "+",
+                                   {"|", "/", "-", "\\"}};
 
 } // namespace pallax::terminal

@@ -1,9 +1,9 @@
 #include "ui/terminal/Overlays.h"
 
+#include "ui/terminal/KeyHelp.h"
 #include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
-#include <array>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -14,31 +14,6 @@ namespace {
 
 constexpr int kFrameColumns = 4; // frame and blanks
 constexpr int kKeyColumns = 18;  // of the help page
-
-struct Help {
-    std::string_view keys;
-    std::string_view meaning;
-};
-
-constexpr auto kHelp = std::to_array<Help>({
-    {"Up Down  k j", "one row up or down"},
-    {"PgUp PgDn", "one page up or down"},
-    {"Home End  g G", "first or last row"},
-    {"Enter Right l", "open the row"},
-    {"Right Left  l h", "scroll a long row"},
-    {"Left h Backspace", "back"},
-    {"Esc", "clear the filter, or back"},
-    {"/", "filter rows by name or value"},
-    {"s", "save a snapshot"},
-    {"y", "copy the value"},
-    {"Tab", "next field of the save screen"},
-    {"Click, wheel", "open the row; scroll"},
-    {"Ctrl-L", "draw the screen again"},
-    {"Ctrl-Z", "suspend; fg comes back"},
-    {"?", "this help"},
-    {"q", "back; at the first pane, quit"},
-    {"Ctrl-C", "quit"},
-});
 
 /// The text in lines of at most so many columns, broken at blanks; a longer word is cut.
 std::vector<std::string> wrapped(std::string_view text, int columns) {
@@ -81,12 +56,12 @@ void drawAlert(Grid& grid, const Marks& marks, const ui::Alert& alert) {
 
 std::vector<std::string> helpLines(int columns) {
     int wanted = 0;
-    for (const Help& help : kHelp) {
+    for (const KeyHelp& help : keyHelp()) {
         wanted = std::max(wanted, kKeyColumns + columnsOf(help.meaning));
     }
     const bool isNarrow = wanted + kFrameColumns > columns;
     std::vector<std::string> lines;
-    for (const Help& help : kHelp) {
+    for (const KeyHelp& help : keyHelp()) {
         std::string line(help.keys);
         if (isNarrow) {
             lines.push_back(std::move(line));

@@ -16,6 +16,8 @@ constexpr int kTitleRow = 0;
 constexpr int kFirstTableRow = 2;
 constexpr int kRowsBelowTable = 2;
 constexpr int kMargin = 1; // before title and status
+constexpr int kGap = 2;    // between texts of one row
+constexpr std::string_view kClearFilter = "Esc clear filter";
 constexpr Style kBold{.bold = true};
 constexpr Style kDim{.dim = true};
 
@@ -28,21 +30,26 @@ const ui::Label* labelOf(const ui::BarItems& items) {
     return nullptr;
 }
 
-/// The titles joined, the first ones left out until the rest fits.
-std::string breadcrumbs(const TerminalNavigation& navigation, const Marks& marks, int columns) {
+/// The titles from one on joined, behind a mark where some are left out.
+std::string breadcrumbs(const TerminalNavigation& navigation, const Marks& marks,
+                        std::size_t first) {
     const auto& screens = navigation.screens();
-    std::string path;
-    for (std::size_t first = 0; first < screens.size(); ++first) {
-        path = first == 0 ? "" : std::string(marks.more);
-        for (std::size_t index = first; index < screens.size(); ++index) {
-            path += path.empty() ? "" : marks.crumb;
-            path += screens[index]->title();
-        }
-        if (columnsOf(path) <= columns) {
-            break;
-        }
+    std::string path(first == 0 ? "" : marks.more);
+    for (std::size_t index = first; index < screens.size(); ++index) {
+        path += path.empty() ? "" : marks.crumb;
+        path += screens[index]->title();
     }
     return path;
+}
+
+/// How many titles must be left out, the first ones first; never the last one.
+std::size_t leftOutCrumbs(const TerminalNavigation& navigation, const Marks& marks, int columns) {
+    const std::size_t last = navigation.screens().size() - 1;
+    std::size_t first = 0;
+    while (first < last && columnsOf(breadcrumbs(navigation, marks, first)) > columns) {
+        ++first;
+    }
+    return first;
 }
 
 /// Bytes [begin, end) of a text.
@@ -87,19 +94,19 @@ void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
     TerminalTable& table = terminalTable(navigation.top().table());
     const int rows = std::max(_grid.rows() - kFirstTableRow - kRowsBelowTable, 0);
     table.setViewport(static_cast<std::size_t>(rows), rowContentBounds(_grid.columns()));
-    drawTitle(navigation, table);
+    drawTitle(navigation, table, status.origin);
     drawRows(table);
-    const int rule = _grid.rows() - kRowsBelowTable;
-    _grid.fill({kMargin, _grid.columns() - kMargin}, kFirstTableRow - 1, _marks.horizontal, kDim);
-    _grid.fill({kMargin, _grid.columns() - kMargin}, rule, _marks.horizontal, kDim);
+    drawUpperRule(table, status);
+    drawLowerRule(table, static_cast<std::size_t>(rows), status);
     if (status.filterEditor != nullptr) {
-        drawFilterPrompt(*status.filterEditor);
+        drawFilterPrompt(*status.filterEditor, status);
     } else if (navigation.isToolbarShown()) {
         drawToolbar(navigation, table, status);
     }
 }
 
-void PaneView::drawTitle(const TerminalNavigation& navigation, TerminalTable& table) {
+void PaneView::drawTitle(TerminalNavigation& navigation, TerminalTable& table,
+                         const Origin& origin) {
     int right = _grid.columns() - kMargin;
     if (!table.filter().empty()) {
         const std::string count =
@@ -108,8 +115,76 @@ void PaneView::drawTitle(const TerminalNavigation& navigation, TerminalTable& ta
         _grid.put(right, kTitleRow, count, kDim);
         right -= 1;
     }
-    const std::string path = breadcrumbs(navigation, _marks, right - kMargin);
-    _grid.put(kMargin, kTitleRow, path, kBold, {kMargin, right});
+    // The way here goes before, whole.
+    const int path = columnsOf(breadcrumbs(navigation, _marks, 0));
+    const std::string beside = originText(origin, _marks, right - kMargin - path - kGap);
+    if (!beside.empty()) {
+        _grid.put(right - columnsOf(beside), kTitleRow, beside, kDim);
+        right -= columnsOf(beside) + kGap;
+    }
+    drawBreadcrumbs(navigation, right);
+}
+
+/// A click on a title goes back to its pane; one on the mark, to the last of those left out.
+void PaneView::drawBreadcrumbs(TerminalNavigation& navigation, int right) {
+    const Span room{kMargin, right};
+    const auto& screens = navigation.screens();
+    const std::size_t first = leftOutCrumbs(navigation, _marks, right - kMargin);
+    int x = kMargin;
+    const auto drawPart = [&](std::string_view text, std::size_t pane) {
+        const int end = _grid.put(x, kTitleRow, text, kBold, room);
+        _hits.add(x, kTitleRow, std::min(end, right) - x, 1,
+                  [&navigation, pane] { navigation.popTo(pane, true); });
+        x = end;
+    };
+    if (first > 0) {
+        drawPart(_marks.more, first - 1);
+    }
+    for (std::size_t index = first; index < screens.size(); ++index) {
+        if (x > kMargin) {
+            x = _grid.put(x, kTitleRow, _marks.crumb, kBold, room);
+        }
+        drawPart(screens[index]->title(), index);
+    }
+}
+
+/// Tells of rows outside the window, at the end of the rule; where that begins is returned. A click
+/// does what the key does.
+int PaneView::drawHiddenRows(int y, std::string_view mark, std::size_t rows, Key key,
+                             const PaneStatus& status) {
+    if (rows == 0) {
+        return _grid.columns() - kMargin;
+    }
+    const int right = _grid.columns() - kMargin - 1;
+    std::string text = " ";
+    text.append(mark).append(1, ' ').append(std::to_string(rows)).append(1, ' ');
+    const int left = right - columnsOf(text);
+    _grid.put(left, y, text);
+    _hits.add(left, y, right - left, 1, [press = status.press, key] { press({.key = key}); });
+    return left;
+}
+
+/// Where the values are old, the line says so.
+void PaneView::drawUpperRule(const TerminalTable& table, const PaneStatus& status) {
+    constexpr int kRow = kFirstTableRow - 1;
+    _grid.fill({kMargin, _grid.columns() - kMargin}, kRow, _marks.horizontal, kDim);
+    const int right = drawHiddenRows(kRow, _marks.up, table.firstShown(), Key::PageUp, status);
+    if (status.oldValues.empty()) {
+        return;
+    }
+    const std::string text = oldValuesText(status.oldValues, right - kMargin);
+    const int end = _grid.put(kMargin, kRow, text + " ", kBold, {kMargin, right});
+    _hits.add(kMargin, kRow, end - kMargin, 1,
+              [press = status.press] { press({.key = Key::Character, .character = U'R'}); });
+}
+
+void PaneView::drawLowerRule(const TerminalTable& table, std::size_t windowRows,
+                             const PaneStatus& status) {
+    const int row = _grid.rows() - kRowsBelowTable;
+    _grid.fill({kMargin, _grid.columns() - kMargin}, row, _marks.horizontal, kDim);
+    const std::size_t end = table.firstShown() + windowRows;
+    const std::size_t below = table.shownRows() - std::min(end, table.shownRows());
+    (void)drawHiddenRows(row, _marks.down, below, Key::PageDown, status);
 }
 
 void PaneView::drawRows(TerminalTable& table) {
@@ -190,7 +265,7 @@ void PaneView::drawToolbar(const TerminalNavigation& navigation, const TerminalT
                            const PaneStatus& status) {
     const ui::BarItems& items = navigation.top().toolbarItems();
     const int end = drawStatus(items, status);
-    drawHints(items, table, end);
+    drawHints(items, table, end, status);
 }
 
 /// A text that does not fit loses its beginning: times and file names stand at the end.
@@ -216,39 +291,53 @@ int PaneView::drawStatus(const ui::BarItems& items, const PaneStatus& status) {
     }
     if (const ui::Label* label = labelOf(items)) {
         x = drawCutInFront(x, y, label->text);
+        const bool hasTime = !isLoading(items) && !label->text.empty();
+        if (hasTime && x + 1 + columnsOf(status.zone) <= _grid.columns() - kMargin) {
+            x = status.zone.empty() ? x : _grid.put(x + 1, y, status.zone, kDim);
+        }
     }
     return status.note.empty() ? x : _grid.put(x + 2, y, status.note, kDim);
 }
 
-/// The keys that matter here, as many as fit behind the status.
-void PaneView::drawHints(const ui::BarItems& items, const TerminalTable& table, int from) {
-    std::vector<std::pair<std::string, std::function<void()>>> hints;
+void PaneView::drawHint(int left, std::string_view text, const KeyEvent& key,
+                        const PaneStatus& status) {
+    const int y = _grid.rows() - 1;
+    const int end = _grid.put(left, y, text, kDim);
+    _hits.add(left, y, end - left, 1, [press = status.press, key] { press(key); });
+}
+
+/// The keys that matter here, as many as fit behind the status; a click does what the key does.
+void PaneView::drawHints(const ui::BarItems& items, const TerminalTable& table, int from,
+                         const PaneStatus& status) {
+    const auto character = [](char32_t key) {
+        return KeyEvent{.key = Key::Character, .character = key};
+    };
+    std::vector<std::pair<std::string_view, KeyEvent>> hints;
     if (!table.filter().empty()) {
-        hints.emplace_back("Esc clear filter", nullptr);
+        hints.emplace_back(kClearFilter, KeyEvent{.key = Key::Escape});
     } else if (table.totalRows() > 0) {
-        hints.emplace_back("/ filter", nullptr);
+        hints.emplace_back("/ filter", character(U'/'));
     }
-    if (const ui::SaveButton* save = saveButtonOf(items)) {
-        hints.emplace_back("s Save", save->action);
+    if (saveButtonOf(items) != nullptr) {
+        hints.emplace_back("s Save", character(U's'));
     }
-    hints.emplace_back("? help", nullptr);
-    constexpr int kGap = 2;
+    hints.emplace_back("? help", character(U'?'));
     int right = _grid.columns() - kMargin;
     for (auto hint = hints.rbegin(); hint != hints.rend(); ++hint) {
         const int left = right - columnsOf(hint->first);
         if (left < from + kGap) {
-            return;
+            break;
         }
-        _grid.put(left, _grid.rows() - 1, hint->first, kDim);
-        if (hint->second) {
-            _hits.add(left, _grid.rows() - 1, right - left, 1, hint->second);
-        }
+        drawHint(left, hint->first, hint->second, status);
         right = left - kGap;
+    }
+    const bool isHelpLeftOut = right == _grid.columns() - kMargin;
+    if (isHelpLeftOut && right - 1 > from) {
+        drawHint(right - 1, "?", character(U'?'), status);
     }
 }
 
-void PaneView::drawFilterPrompt(const LineEditor& editor) {
-    constexpr std::string_view kHint = "Esc clear filter";
+void PaneView::drawFilterPrompt(const LineEditor& editor, const PaneStatus& status) {
     const int y = _grid.rows() - 1;
     const int start = kMargin + 2; // behind "/ "
     const int cursor = columnsOf(std::string_view(editor.text()).substr(0, editor.cursor()));
@@ -258,9 +347,9 @@ void PaneView::drawFilterPrompt(const LineEditor& editor) {
     _grid.put(kMargin, y, "/", kBold);
     const int end = _grid.put(start - offset, y, editor.text(), {}, {start, last});
     _grid.setCursor({start + cursor - offset, y});
-    const int left = _grid.columns() - kMargin - columnsOf(kHint);
+    const int left = _grid.columns() - kMargin - columnsOf(kClearFilter);
     if (left > end + 1) {
-        _grid.put(left, y, kHint, kDim);
+        drawHint(left, kClearFilter, {.key = Key::Escape}, status);
     }
 }
 

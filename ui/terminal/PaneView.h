@@ -2,11 +2,14 @@
 
 #include "ui/terminal/Grid.h"
 #include "ui/terminal/HitMap.h"
+#include "ui/terminal/Keys.h"
 #include "ui/terminal/Marks.h"
+#include "ui/terminal/Origin.h"
 #include "ui/terminal/TerminalNavigation.h"
 #include "ui/terminal/TerminalTable.h"
 
 #include <cstddef>
+#include <functional>
 #include <optional>
 #include <string>
 
@@ -14,12 +17,16 @@ namespace pallax::terminal {
 
 class LineEditor;
 
-/// What the toolbar of a pane shows beside the pane's own items.
+/// What is shown around a pane's rows beside the pane's own items.
 struct PaneStatus {
     std::size_t spinnerTurn = 0;              ///< counts up while the spinner turns
     const LineEditor* filterEditor = nullptr; ///< while a filter is being typed
     std::optional<std::string> message;       ///< in the status text's place
     std::string note;                         ///< behind the status text
+    Origin origin;                            ///< in the title
+    std::string oldValues;                    ///< the time of values that are none of the modem's
+    std::string zone;                         ///< of the status text's time
+    std::function<void(const KeyEvent&)> press = [](const KeyEvent&) {}; ///< by a click
 };
 
 /// Whether the toolbar's activity indicator turns.
@@ -33,11 +40,18 @@ public:
     PaneView(Grid& grid, const Marks& marks, HitMap& hits)
         : _grid(grid), _marks(marks), _hits(hits) {}
 
-    /// Also tells the pane's table how much room it has.
+    /// Also tells the pane's table how much room it has. What can be clicked refers to the
+    /// navigation.
     void draw(TerminalNavigation& navigation, const PaneStatus& status);
 
 private:
-    void drawTitle(const TerminalNavigation& navigation, TerminalTable& table);
+    void drawTitle(TerminalNavigation& navigation, TerminalTable& table, const Origin& origin);
+    void drawBreadcrumbs(TerminalNavigation& navigation, int right);
+    void drawUpperRule(const TerminalTable& table, const PaneStatus& status);
+    void drawLowerRule(const TerminalTable& table, std::size_t windowRows,
+                       const PaneStatus& status);
+    int drawHiddenRows(int y, std::string_view mark, std::size_t rows, Key key,
+                       const PaneStatus& status);
     void drawRows(TerminalTable& table);
     void drawRow(TerminalTable& table, std::size_t shown, int y);
     void drawCell(const TerminalTable& table, ui::TableCell& cell, const ui::RowText& row, int y,
@@ -46,10 +60,12 @@ private:
                    std::string_view filter);
     void drawToolbar(const TerminalNavigation& navigation, const TerminalTable& table,
                      const PaneStatus& status);
-    void drawFilterPrompt(const LineEditor& editor);
+    void drawFilterPrompt(const LineEditor& editor, const PaneStatus& status);
+    void drawHint(int left, std::string_view text, const KeyEvent& key, const PaneStatus& status);
     int drawCutInFront(int x, int y, std::string_view text);
     int drawStatus(const ui::BarItems& items, const PaneStatus& status);
-    void drawHints(const ui::BarItems& items, const TerminalTable& table, int from);
+    void drawHints(const ui::BarItems& items, const TerminalTable& table, int from,
+                   const PaneStatus& status);
 
     Grid& _grid;
     const Marks& _marks;

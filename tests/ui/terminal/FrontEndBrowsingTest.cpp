@@ -206,11 +206,27 @@ TEST_F(FrontEndBrowsingTest, WhereSavingIsNotOfferedSSaysSo) {
     stage.frontEnd.resize(60, 12);
     stage.type("s");
     EXPECT_EQ(stage.saveScreen(), nullptr);
-    EXPECT_EQ(stage.line(11), " Saving is not enabled here                / filter  ? help");
+    EXPECT_EQ(stage.screen(60, 12), R"(
+ Pallax
+ ──────────────────────────────────────────────────────────
+▌Serving Cell Measurements                                 ›
+┌ Saving is not enabled here ──────────────────────────────┐
+│ Two settings in pallax.conf enable it:                   │
+│ snapshot-directory, where snapshots go, and              │
+│ save-button-marker, a path that exists.                  │
+│                                                [ Close ] │
+└──────────────────────────────────────────────────────────┘
+
+ ──────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20            / filter  ? help
+)");
+    EXPECT_EQ(faultOf(stage.frontEnd.draw()), "");
+    stage.press(Key::Escape);
+    EXPECT_EQ(stage.frontEnd.toolkit().alert(), nullptr);
 }
 
 TEST_F(FrontEndBrowsingTest, OtherKeysDoNothing) {
-    const std::string known = "jklhgG/syq?";
+    const std::string known = "jklhgG/syRq?";
     const std::string before = stage.screen();
     const int displays = stage.displays;
     for (char32_t character = 0; character < 0x180; ++character) {
@@ -303,7 +319,7 @@ TEST_F(FrontEndBrowsingTest, AScreenThatIsTooSmallSaysWhatItNeeds) {
  Pallax
  ──────────────────
 ▌Serving Cell Mea… ›
- ──────────────────
+ ──────────── ↓ 4 ─
  …11-14 at 22:13:20
 )");
 }

@@ -35,15 +35,15 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
               │ /                 filter rows by name or value  │
               │ s                 save a snapshot               │
               │ y                 copy the value                │
+              │ R                 connect anew, drop old values │
               │ Tab               next field of the save screen │
-              │ Click, wheel      open the row; scroll          │
+              │ Click, wheel      open what is clicked; scroll  │
               │ Ctrl-L            draw the screen again         │
               │ Ctrl-Z            suspend; fg comes back        │
               │ ?                 this help                     │
               │ q                 back; at the first pane, quit │
               │ Ctrl-C            quit                          │
               └─────────────────────────────────────────────────┘
-
  ──────────────────────────────────────────────────────────────────────────────
  Updated 2023-11-14 at 22:13:20                        / filter  s Save  ? help
 )");
@@ -100,6 +100,24 @@ TEST_F(FrontEndHelpTest, PagesWheelAndLettersScrollItToo) {
     EXPECT_EQ(stage.line(1), "│ PgUp PgDn        │");
     stage.frontEnd.handle({Key::WheelUp});
     EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
+}
+
+TEST_F(FrontEndHelpTest, HomeAndEndScrollItToItsEndsAndLeaveItOpen) {
+    stage.type("?");
+    stage.frontEnd.resize(20, 5);
+    (void)stage.frontEnd.draw();
+    stage.press(Key::End);
+    EXPECT_EQ(stage.line(3), "│  quit            │");
+    stage.press(Key::Home);
+    EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
+    stage.type("G");
+    EXPECT_EQ(stage.line(3), "│  quit            │");
+    stage.type("g");
+    EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
+    stage.frontEnd.resize(80, 24);
+    const std::string whole = stage.screen();
+    stage.press(Key::End);
+    EXPECT_EQ(stage.screen(), whole);
 }
 
 TEST_F(FrontEndHelpTest, ScrolledToItsEndItFillsAScreenThatGrows) {
@@ -182,9 +200,9 @@ std::vector<std::string> namedKeys() {
 TEST_F(FrontEndHelpTest, EveryKeyIsNamed) {
     const std::vector<std::string> names = namedKeys();
     for (const char* key :
-         {"Up",        "Down", "PgUp", "PgDn", "Home",   "End",    "Enter", "Right", "Left",
-          "Backspace", "Esc",  "h",    "j",    "k",      "l",      "g",     "G",     "/",
-          "s",         "y",    "?",    "q",    "Ctrl-L", "Ctrl-Z", "Tab"}) {
+         {"Up",        "Down", "PgUp", "PgDn", "Home", "End",    "Enter",  "Right", "Left",
+          "Backspace", "Esc",  "h",    "j",    "k",    "l",      "g",      "G",     "/",
+          "s",         "y",    "R",    "?",    "q",    "Ctrl-L", "Ctrl-Z", "Tab"}) {
         EXPECT_NE(std::find(names.begin(), names.end(), key), names.end()) << key;
     }
 }
@@ -200,7 +218,7 @@ TEST_F(FrontEndHelpTest, EveryCharacterThatDoesSomethingIsNamed) {
         const int displays = fresh.displays;
         const std::string name(1, character);
         fresh.type(name);
-        const bool didSomething = fresh.displays != displays;
+        const bool didSomething = fresh.displays != displays || fresh.startsAfresh > 0;
         const bool isNamed = std::find(names.begin(), names.end(), name) != names.end();
         // Where it would scroll or open, 'l' finds nothing to do on this row.
         EXPECT_EQ(didSomething || character == 'l', isNamed) << name;

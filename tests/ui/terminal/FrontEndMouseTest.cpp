@@ -71,6 +71,43 @@ TEST_F(FrontEndMouseTest, AClickOnNothingDoesNothing) {
     EXPECT_EQ(stage.screen(), before);
 }
 
+TEST_F(FrontEndMouseTest, AClickOnAHintDoesWhatItsKeyDoes) {
+    stage.frontEnd.resize(80, 24);
+    clickOn("/ filter");
+    EXPECT_TRUE(isEditing());
+    stage.type("info");
+    clickOn("Esc clear filter"); // beside the prompt
+    EXPECT_FALSE(isEditing());
+    EXPECT_EQ(stage.table().filter(), "");
+    stage.type("/info");
+    stage.press(Key::Enter);
+    clickOn("Esc clear filter"); // in the toolbar
+    EXPECT_EQ(stage.table().filter(), "");
+    clickOn("? help");
+    EXPECT_NE(stage.screen().find("┌ Keys"), std::string::npos);
+    stage.press(Key::Escape);
+    clickOn("s Save");
+    EXPECT_NE(stage.saveScreen(), nullptr);
+}
+
+TEST_F(FrontEndMouseTest, AClickOnATitleGoesBackToItsPane) {
+    stage.tick(Dictionary{{"Outer", Dictionary{{"Middle", Dictionary{{"Inner", Dictionary{}}}}}}});
+    stage.press(Key::Enter, 3);
+    ASSERT_EQ(stage.line(0), " Pallax › Outer › Middle › Inner");
+    clickOn("Inner");
+    clickOn("› Inner"); // between two of them
+    EXPECT_EQ(stage.depth(), 4U);
+    clickOn("Outer");
+    EXPECT_EQ(stage.line(0), " Pallax › Outer");
+    clickOn("Pallax");
+    EXPECT_EQ(stage.line(0), " Pallax");
+    stage.press(Key::Enter, 3);
+    stage.frontEnd.resize(20, 8);
+    ASSERT_EQ(stage.line(0), " … › Middle › Inner");
+    clickOn("…");
+    EXPECT_EQ(stage.line(0), " Pallax › Outer");
+}
+
 TEST_F(FrontEndMouseTest, AClickThatComesBeforeTheNextDrawingDoesNothing) {
     stage.click(5, 2);
     ASSERT_EQ(stage.depth(), 2U);

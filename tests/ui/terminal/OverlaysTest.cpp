@@ -109,8 +109,9 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ /                 filter rows by name or value  │
 │ s                 save a snapshot               │
 │ y                 copy the value                │
+│ R                 connect anew, drop old values │
 │ Tab               next field of the save screen │
-│ Click, wheel      open the row; scroll          │
+│ Click, wheel      open what is clicked; scroll  │
 │ Ctrl-L            draw the screen again         │
 │ Ctrl-Z            suspend; fg comes back        │
 │ ?                 this help                     │

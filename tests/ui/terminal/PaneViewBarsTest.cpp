@@ -43,7 +43,9 @@ TEST_F(PaneViewBarsTest, HintsThatDoNotFitAreLeftOutFromTheLeft) {
         {48, " Updated 2023-11-14 at 22:13:20  s Save  ? help"},
         {47, " Updated 2023-11-14 at 22:13:20         ? help"},
         {40, " Updated 2023-11-14 at 22:13:20  ? help"},
-        {39, " Updated 2023-11-14 at 22:13:20"},
+        {39, " Updated 2023-11-14 at 22:13:20      ?"},
+        {34, " Updated 2023-11-14 at 22:13:20 ?"},
+        {33, " Updated 2023-11-14 at 22:13:20"},
         {32, " Updated 2023-11-14 at 22:13:20"},
         {31, " …dated 2023-11-14 at 22:13:20"},
         {20, " …11-14 at 22:13:20"},
@@ -68,6 +70,31 @@ TEST_F(PaneViewBarsTest, ANoteStandsBehindTheStatus) {
     EXPECT_EQ(stage.line(11),
               " Updated 2023-11-14 at 22:13:20  End of the recording  / filter  s Save  ? help");
     EXPECT_EQ(styleAt(33, 11), Style{.dim = true});
+}
+
+TEST_F(PaneViewBarsTest, TheStatusTextsTimeNamesItsZone) {
+    stage.zone = "+0200";
+    stage.frontEnd.resize(40, 12);
+    EXPECT_EQ(stage.line(11), " ⠋ Connecting            s Save  ? help") << "there is no time";
+    stage.tick(display());
+    const std::pair<int, const char*> expected[] = {
+        {80, " Updated 2023-11-14 at 22:13:20 +0200                  / filter  s Save  ? help"},
+        {40, " Updated 2023-11-14 at 22:13:20 +0200 ?"},
+        {38, " Updated 2023-11-14 at 22:13:20 +0200"},
+        {37, " Updated 2023-11-14 at 22:13:20    ?"},
+        {20, " …11-14 at 22:13:20"},
+    };
+    for (const auto& [columns, toolbar] : expected) {
+        stage.frontEnd.resize(columns, 12);
+        EXPECT_EQ(stage.line(11), toolbar) << columns;
+    }
+    stage.frontEnd.resize(80, 12);
+    EXPECT_EQ(styleAt(33, 11), Style{.dim = true});
+    stage.frontEnd.setNote("End of the recording");
+    EXPECT_EQ(stage.line(11),
+              " Updated 2023-11-14 at 22:13:20 +0200  End of the recording      s Save  ? help");
+    stage.frontEnd.setMessage("Saved");
+    EXPECT_EQ(stage.line(11).find("+0200"), std::string::npos);
 }
 
 TEST_F(PaneViewBarsTest, AFilterBeingTypedIsAPromptWithTheMatchesUnderlined) {
@@ -104,7 +131,7 @@ TEST_F(PaneViewBarsTest, AFilterBeingTypedIsAPromptWithTheMatchesUnderlined) {
  … › Serving 2 of 6
  ──────────────────
 ▌Measured RSRP   …
- ──────────────────
+ ──────────── ↓ 1 ─
  / rsrp
 )");
     EXPECT_EQ(stage.screen(40, 12), R"(

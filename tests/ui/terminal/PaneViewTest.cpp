@@ -55,7 +55,7 @@ TEST_F(PaneViewTest, APaneWithoutDataIsEmptyAboveASpinner) {
  ──────────────────
 
  ──────────────────
- ⠋ Connecting
+ ⠋ Connecting     ?
 )");
 }
 
@@ -105,7 +105,7 @@ TEST_F(PaneViewTest, TheRootPaneShowsBranchesWithMarksAndListsWithCounts) {
  Pallax
  ──────────────────
 ▌Serving Cell Mea… ›
- ──────────────────
+ ──────────── ↓ 4 ─
  …11-14 at 22:13:20
 )");
 }
@@ -157,7 +157,7 @@ TEST_F(PaneViewTest, ASectionShowsNamesLeftAndValuesRight) {
  … › Serving Cell M
  ──────────────────
 ▌Version         1
- ──────────────────
+ ──────────── ↓ 5 ─
  …11-14 at 22:13:20
 )");
 }
@@ -184,13 +184,40 @@ TEST_F(PaneViewTest, MoreRowsThanRoomScrollWithTheCursor) {
     stage.press(Key::End);
     EXPECT_EQ(stage.screen(), R"(
  Pallax › Serving Cell Measurements
- ──────────────────────────────────────
+ ──────────────────────────────── ↑ 3 ─
  Measured RSRP              -94.75 dBm
  Average RSRP               -95.00 dBm
 ▌Measured RSRQ                -9.50 dB
  ──────────────────────────────────────
  Updated 2023-11-14 at 22:13:20  ? help
 )");
+}
+
+TEST_F(PaneViewTest, RowsAboveAndBelowTheWindowAreHintedAt) {
+    stage.tick(display());
+    stage.press(Key::Enter);
+    stage.frontEnd.resize(40, 7);
+    EXPECT_EQ(stage.line(1), " ──────────────────────────────────────");
+    EXPECT_EQ(stage.line(5), " ──────────────────────────────── ↓ 3 ─");
+    stage.press(Key::Down, 3);
+    EXPECT_EQ(stage.screen(), R"(
+ Pallax › Serving Cell Measurements
+ ──────────────────────────────── ↑ 1 ─
+ E-ARFCN                          1850
+ Physical Cell ID                  274
+▌Measured RSRP              -94.75 dBm
+ ──────────────────────────────── ↓ 2 ─
+ Updated 2023-11-14 at 22:13:20  ? help
+)");
+    EXPECT_EQ(styleAt(34, 1), Style{});
+    stage.click(34, 5);
+    EXPECT_EQ(stage.cursorName(), "Measured RSRQ");
+    stage.click(34, 1);
+    EXPECT_EQ(stage.cursorName(), "Measured RSRP");
+    stage.type("/measured");
+    EXPECT_EQ(stage.line(1), " ──────────────────────────────────────")
+        << "all that match are seen";
+    EXPECT_EQ(stage.line(5), " ──────────────────────────────────────");
 }
 
 TEST_F(PaneViewTest, WhatIsWhereTellsItsStyle) {

@@ -93,6 +93,10 @@ private:
             return _stage.frontEnd.setMessage("A message 漢字\xff");
         case 0x98:
             return _stage.frontEnd.setNote("A note");
+        case 0x9B:
+            return _stage.frontEnd.setOrigin({"Zorell_LTE", "漢字\xff.pcap"});
+        case 0x9C:
+            return _stage.frontEnd.setOldValues(next() % 2 == 0 ? "22:13:30" : "");
         case 0x99:
             return _stage.queue.runReady();
         case 0x9A:

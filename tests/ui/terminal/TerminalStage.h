@@ -25,7 +25,7 @@ public:
     explicit TerminalStage(const Marks& marks = kUtf8Marks)
         : frontEnd({[this] { ++displays; }, [this] { ++quits; },
                     [this](const std::string& text) { copied.push_back(text); },
-                    [this] { ++repaints; }},
+                    [this] { ++repaints; }, [this] { ++startsAfresh; }, [this] { return zone; }},
                    marks),
           _window(frontEnd.toolkit().makeWindow({})) {
         auto root = std::make_shared<PallaxPaneController>(frontEnd.toolkit(), *this, nullptr, "/");
@@ -40,6 +40,8 @@ public:
     int displays = 0;
     int quits = 0;
     int repaints = 0;
+    int startsAfresh = 0;
+    std::string zone; ///< of the status text's time
     std::vector<std::string> copied;
 
     bool savingAllowed = true;

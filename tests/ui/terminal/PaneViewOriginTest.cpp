@@ -1,0 +1,164 @@
+#include "tests/ui/terminal/StageFixture.h"
+#include "ui/terminal/Origin.h"
+#include "ui/terminal/TextWidth.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <string>
+#include <utility>
+
+namespace pallax::terminal {
+namespace {
+
+/// What the title and the line below it tell of where the values come from.
+class PaneViewOriginTest : public StageFixture {
+protected:
+    PaneViewOriginTest() { stage.tick(display()); }
+    void setOrigin() { stage.frontEnd.setOrigin({"Zorell_LTE", "lte-drive.pcap"}); }
+};
+
+TEST_F(PaneViewOriginTest, TechnologyAndSourceStandBesideTheWayHere) {
+    setOrigin();
+    EXPECT_EQ(stage.screen(80, 8), R"(
+ Pallax                                             Zorell_LTE · lte-drive.pcap
+ ──────────────────────────────────────────────────────────────────────────────
+▌Serving Cell Measurements                                                     ›
+ Measured Neighbor Cells                                                     3 ›
+ Empty List                                                                    ›
+ SIM Info                                                                      ›
+ ──────────────────────────────────────────────────────────────────────── ↓ 1 ─
+ Updated 2023-11-14 at 22:13:20                        / filter  s Save  ? help
+)");
+    EXPECT_EQ(styleAt(60, 0), Style{.dim = true});
+    stage.press(Key::Enter);
+    EXPECT_EQ(stage.line(0),
+              " Pallax › Serving Cell Measurements                 Zorell_LTE · lte-drive.pcap");
+}
+
+TEST_F(PaneViewOriginTest, WhatDoesNotFitIsShortenedOrLeftOut) {
+    setOrigin();
+    const std::pair<int, const char*> atTheRoot[] = {
+        {40, " Pallax     Zorell_LTE · lte-drive.pcap"},
+        {37, " Pallax  Zorell_LTE · lte-drive.pcap"},
+        {36, " Pallax  Zorell_LTE · …e-drive.pcap"},
+        {29, " Pallax  Zorell_LTE · ….pcap"},
+        {28, " Pallax          Zorell_LTE"},
+        {20, " Pallax  Zorell_LTE"},
+    };
+    for (const auto& [columns, title] : atTheRoot) {
+        stage.frontEnd.resize(columns, 8);
+        EXPECT_EQ(stage.line(0), title) << columns;
+    }
+    stage.press(Key::Enter);
+    const std::pair<int, const char*> inASection[] = {
+        {80, " Pallax › Serving Cell Measurements                 Zorell_LTE · lte-drive.pcap"},
+        {60, " Pallax › Serving Cell Measurements  Zorell_LTE · …ive.pcap"},
+        {40, " Pallax › Serving Cell Measurements"},
+    };
+    for (const auto& [columns, title] : inASection) {
+        stage.frontEnd.resize(columns, 8);
+        EXPECT_EQ(stage.line(0), title) << columns;
+    }
+}
+
+TEST_F(PaneViewOriginTest, AFiltersCountStandsBehindThem) {
+    setOrigin();
+    stage.type("/info");
+    stage.frontEnd.resize(60, 8);
+    EXPECT_EQ(stage.line(0), " Pallax                  Zorell_LTE · lte-drive.pcap 1 of 5");
+}
+
+TEST_F(PaneViewOriginTest, WhatIsNotKnownYetIsNotShown) {
+    stage.frontEnd.setOrigin({"", "live modem"});
+    stage.frontEnd.resize(40, 8);
+    EXPECT_EQ(stage.line(0), " Pallax                      live modem");
+    stage.frontEnd.setOrigin({"Zorell_LTE", ""});
+    EXPECT_EQ(stage.line(0), " Pallax                      Zorell_LTE");
+}
+
+TEST_F(PaneViewOriginTest, TheTextNeverTakesMoreThanItsRoom) {
+    const Origin origin{"Zorell_LTE", "漢字漢字漢字\x1b.pcap"};
+    for (int columns = -3; columns < 50; ++columns) {
+        const std::string text = originText(origin, kUtf8Marks, columns);
+        EXPECT_LE(columnsOf(text), std::max(columns, 0)) << text;
+    }
+    EXPECT_EQ(originText(origin, kUtf8Marks, 26), "Zorell_LTE · …字\\x1B.pcap");
+}
+
+TEST_F(PaneViewOriginTest, OldValuesAreToldAboveTheRows) {
+    setOrigin();
+    stage.frontEnd.setOldValues("22:13:30");
+    EXPECT_EQ(stage.screen(80, 8), R"(
+ Pallax                                             Zorell_LTE · lte-drive.pcap
+ values from before 22:13:30: press R to start afresh ─────────────────────────
+▌Serving Cell Measurements                                                     ›
+ Measured Neighbor Cells                                                     3 ›
+ Empty List                                                                    ›
+ SIM Info                                                                      ›
+ ──────────────────────────────────────────────────────────────────────── ↓ 1 ─
+ Updated 2023-11-14 at 22:13:20                        / filter  s Save  ? help
+)");
+    EXPECT_EQ(styleAt(1, 1), Style{.bold = true});
+    const std::pair<int, const char*> expected[] = {
+        {56, " values from before 22:13:30: press R to start afresh ─"},
+        {54, " values from before 22:13:30: press R to start afresh"},
+        {53, " values from before 22:13:30: R renews ─────────────"},
+        {39, " values from before 22:13:30: R renews"},
+        {38, " old values: R ──────────────────────"},
+        {20, " old values: R ────"},
+    };
+    for (const auto& [columns, line] : expected) {
+        stage.frontEnd.resize(columns, 9);
+        EXPECT_EQ(stage.line(1), line) << columns;
+    }
+    stage.frontEnd.resize(60, 6); // rows above the window are still hinted at
+    stage.press(Key::End);
+    EXPECT_EQ(stage.line(1), " values from before 22:13:30: press R to start afresh ↑ 3 ─");
+    stage.frontEnd.resize(40, 6);
+    EXPECT_EQ(stage.line(1), " old values: R ────────────────── ↑ 3 ─");
+    stage.frontEnd.setOldValues("");
+    EXPECT_EQ(stage.line(1), " ──────────────────────────────── ↑ 3 ─");
+}
+
+TEST_F(PaneViewOriginTest, RStartsAfreshAndSoDoesAClickOnTheOffer) {
+    stage.type("R");
+    EXPECT_EQ(stage.startsAfresh, 1);
+    stage.click(3, 1);
+    EXPECT_EQ(stage.startsAfresh, 1) << "nothing is offered there";
+    stage.frontEnd.setOldValues("22:13:30");
+    stage.click(3, 1);
+    EXPECT_EQ(stage.startsAfresh, 2);
+    stage.press(Key::Enter);
+    stage.type("/R");
+    EXPECT_EQ(stage.startsAfresh, 2) << "it is typed";
+    stage.press(Key::Enter);
+    stage.type("R");
+    EXPECT_EQ(stage.startsAfresh, 3);
+    stage.saveHistory = snapshotItems();
+    stage.type("sR");
+    EXPECT_EQ(stage.startsAfresh, 3) << "it is typed";
+    stage.press(Key::Tab);
+    stage.type("R");
+    EXPECT_EQ(stage.startsAfresh, 3) << "not under the save screen";
+}
+
+TEST_F(PaneViewOriginTest, InAsciiTheMarksAreAscii) {
+    TerminalStage ascii(kAsciiMarks);
+    ascii.tick(display());
+    ascii.frontEnd.setOrigin({"Zorell_LTE", "drive.pcap"});
+    ascii.frontEnd.resize(40, 6);
+    (void)ascii.screen();
+    ascii.press(Key::Down, 2);
+    EXPECT_EQ(ascii.screen(), R"(
+ Pallax          Zorell_LTE, drive.pcap
+ -------------------------------- ^ 1 -
+ Measured Neighbor Cells             3 >
+>Empty List                            >
+ -------------------------------- v 2 -
+ Updated 2023-11-14 at 22:13:20  ? help
+)");
+}
+
+} // namespace
+} // namespace pallax::terminal

@@ -1,0 +1,81 @@
+#include "ui/terminal/HelpPage.h"
+
+#include "ui/terminal/Overlays.h"
+
+#include <algorithm>
+#include <optional>
+
+namespace pallax::terminal {
+
+namespace {
+
+/// By how many of `lines` lines a key scrolls a page that shows `rows` of them; nothing for a key
+/// that does not scroll.
+std::optional<int> scrolledLines(const KeyEvent& event, int rows, int lines) {
+    constexpr int kWheelLines = 3;
+    switch (event.key) {
+    case Key::Up:
+        return -1;
+    case Key::Down:
+        return 1;
+    case Key::PageUp:
+        return -rows;
+    case Key::PageDown:
+        return rows;
+    case Key::Home:
+        return -lines;
+    case Key::End:
+        return lines;
+    case Key::WheelUp:
+        return -kWheelLines;
+    case Key::WheelDown:
+        return kWheelLines;
+    default:
+        return std::nullopt;
+    }
+}
+
+/// The letters that stand for keys.
+KeyEvent withoutLetters(const KeyEvent& event) {
+    if (event.key != Key::Character) {
+        return event;
+    }
+    switch (event.character) {
+    case U'k':
+        return {.key = Key::Up};
+    case U'j':
+        return {.key = Key::Down};
+    case U'g':
+        return {.key = Key::Home};
+    case U'G':
+        return {.key = Key::End};
+    default:
+        return event;
+    }
+}
+
+} // namespace
+
+void HelpPage::open() {
+    _isOpen = true;
+    _first = 0;
+}
+
+/// The line at which the page begins when it is scrolled to its end.
+int HelpPage::lastFirst() const {
+    return std::max(_lines - _rows, 0);
+}
+
+void HelpPage::handle(const KeyEvent& event) {
+    const auto lines = scrolledLines(withoutLetters(event), _rows, _lines);
+    _first = std::clamp(_first + lines.value_or(0), 0, lastFirst());
+    _isOpen = lines.has_value();
+}
+
+void HelpPage::draw(Grid& grid, const Marks& marks) {
+    _rows = drawHelp(grid, marks, _first);
+    _lines = static_cast<int>(helpLines(grid.columns()).size());
+    _first = std::min(_first, lastFirst()); // there may be more room than before
+}
+
+} // namespace pallax::terminal

@@ -1,0 +1,36 @@
+#include "ui/terminal/KeyHelp.h"
+
+#include <array>
+
+namespace pallax::terminal {
+
+namespace {
+
+constexpr auto kKeyHelp = std::to_array<KeyHelp>({
+    {"Up Down  k j", "one row up or down"},
+    {"PgUp PgDn", "one page up or down"},
+    {"Home End  g G", "first or last row"},
+    {"Enter Right l", "open the row"},
+    {"Right Left  l h", "scroll a long row"},
+    {"Left h Backspace", "back"},
+    {"Esc", "clear the filter, or back"},
+    {"/", "filter rows by name or value"},
+    {"s", "save a snapshot"},
+    {"y", "copy the value"},
+    {"R", "connect anew, drop old values"},
+    {"Tab", "next field of the save screen"},
+    {"Click, wheel", "open what is clicked; scroll"},
+    {"Ctrl-L", "draw the screen again"},
+    {"Ctrl-Z", "suspend; fg comes back"},
+    {"?", "this help"},
+    {"q", "back; at the first pane, quit"},
+    {"Ctrl-C", "quit"},
+});
+
+} // namespace
+
+std::span<const KeyHelp> keyHelp() {
+    return kKeyHelp;
+}
+
+} // namespace pallax::terminal

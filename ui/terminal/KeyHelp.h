@@ -1,0 +1,16 @@
+#pragma once
+
+#include <span>
+#include <string_view>
+
+namespace pallax::terminal {
+
+/// Keys and what they do, as the help page and the manual list them.
+struct KeyHelp {
+    std::string_view keys; ///< alternatives, each behind a blank
+    std::string_view meaning;
+};
+
+std::span<const KeyHelp> keyHelp();
+
+} // namespace pallax::terminal

@@ -1,0 +1,57 @@
+#include "ui/terminal/Origin.h"
+
+#include "ui/terminal/TextWidth.h"
+
+#include <vector>
+
+namespace pallax::terminal {
+
+namespace {
+
+/// The end of the text, behind a mark, in at most so many columns; empty where that says too
+/// little.
+std::string endOf(std::string_view text, const Marks& marks, int columns) {
+    constexpr int kLeastColumns = 6; // of which the mark is one
+    if (columns < kLeastColumns) {
+        return "";
+    }
+    const std::vector<Cluster> clusters = clustersOf(text);
+    std::size_t start = clusters.size();
+    int left = columns - columnsOf(marks.more);
+    while (start > 0 && clusters[start - 1].columns <= left) {
+        left -= clusters[--start].columns;
+    }
+    std::string end(marks.more);
+    for (; start < clusters.size(); ++start) {
+        end += clusters[start].text;
+    }
+    return end;
+}
+
+} // namespace
+
+std::string originText(const Origin& origin, const Marks& marks, int columns) {
+    const bool hasBoth = !origin.technology.empty() && !origin.source.empty();
+    const std::string before = origin.technology + (hasBoth ? std::string(marks.dot) : "");
+    if (columnsOf(before) + columnsOf(origin.source) <= columns) {
+        return before + origin.source;
+    }
+    if (const std::string end = endOf(origin.source, marks, columns - columnsOf(before));
+        !end.empty()) {
+        return before + end;
+    }
+    return columnsOf(origin.technology) <= columns ? origin.technology : "";
+}
+
+std::string oldValuesText(std::string_view time, int columns) {
+    const std::string from = "values from before " + std::string(time);
+    for (const std::string& text :
+         {from + ": press R to start afresh", from + ": R renews", std::string("old values: R")}) {
+        if (columnsOf(text) <= columns) {
+            return text;
+        }
+    }
+    return "R";
+}
+
+} // namespace pallax::terminal
