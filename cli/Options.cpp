@@ -39,7 +39,9 @@ constexpr const char* kDecodeFooter = R"(Examples:
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
 standard input; a recording may be a named pipe. On a terminal, what takes more
-than two seconds shows how far it has come.
+than two seconds shows how far it has come, and characters that could command
+the terminal stand as escapes (\x1B, \u202E); files and pipes get CSV as the
+modem sent it.
 
 Exit status:
   0   success, also when nobody reads the output any more

@@ -97,11 +97,11 @@ void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
     drawTitle(navigation, table, status.origin);
     drawRows(table);
     drawUpperRule(table, status);
-    drawLowerRule(table, static_cast<std::size_t>(rows), status);
+    const int ruleRight = drawLowerRule(table, static_cast<std::size_t>(rows), status);
     if (status.filterEditor != nullptr) {
         drawFilterPrompt(*status.filterEditor, status);
     } else if (navigation.isToolbarShown()) {
-        drawToolbar(navigation, table, status);
+        drawToolbar(navigation, table, status, ruleRight);
     }
 }
 
@@ -178,13 +178,14 @@ void PaneView::drawUpperRule(const TerminalTable& table, const PaneStatus& statu
               [press = status.press] { press({.key = Key::Character, .character = U'R'}); });
 }
 
-void PaneView::drawLowerRule(const TerminalTable& table, std::size_t windowRows,
-                             const PaneStatus& status) {
+/// Returns where what tells of hidden rows begins.
+int PaneView::drawLowerRule(const TerminalTable& table, std::size_t windowRows,
+                            const PaneStatus& status) {
     const int row = _grid.rows() - kRowsBelowTable;
     _grid.fill({kMargin, _grid.columns() - kMargin}, row, _marks.horizontal, kDim);
     const std::size_t end = table.firstShown() + windowRows;
     const std::size_t below = table.shownRows() - std::min(end, table.shownRows());
-    (void)drawHiddenRows(row, _marks.down, below, Key::PageDown, status);
+    return drawHiddenRows(row, _marks.down, below, Key::PageDown, status);
 }
 
 void PaneView::drawRows(TerminalTable& table) {
@@ -262,9 +263,9 @@ void PaneView::drawLabel(const ui::Label& label, int x, int y, Style style, Span
 }
 
 void PaneView::drawToolbar(const TerminalNavigation& navigation, const TerminalTable& table,
-                           const PaneStatus& status) {
+                           const PaneStatus& status, int ruleRight) {
     const ui::BarItems& items = navigation.top().toolbarItems();
-    const int end = drawStatus(items, status);
+    const int end = drawStatus(items, status, ruleRight);
     drawHints(items, table, end, status);
 }
 
@@ -280,7 +281,7 @@ int PaneView::drawCutInFront(int x, int y, std::string_view text) {
     return right;
 }
 
-int PaneView::drawStatus(const ui::BarItems& items, const PaneStatus& status) {
+int PaneView::drawStatus(const ui::BarItems& items, const PaneStatus& status, int ruleRight) {
     const int y = _grid.rows() - 1;
     int x = kMargin;
     if (status.message) {
@@ -296,7 +297,14 @@ int PaneView::drawStatus(const ui::BarItems& items, const PaneStatus& status) {
             x = status.zone.empty() ? x : _grid.put(x + 1, y, status.zone, kDim);
         }
     }
-    return status.note.empty() ? x : _grid.put(x + 2, y, status.note, kDim);
+    if (status.note.empty()) {
+        return x;
+    }
+    if (x + kGap + columnsOf(status.note) <= _grid.columns() - kMargin) {
+        return _grid.put(x + kGap, y, status.note, kDim);
+    }
+    (void)_grid.put(kMargin, y - 1, status.note + " ", {}, {kMargin, ruleRight}); // in the rule
+    return x;
 }
 
 void PaneView::drawHint(int left, std::string_view text, const KeyEvent& key,

@@ -22,10 +22,10 @@ struct PaneStatus {
     std::size_t spinnerTurn = 0;              ///< counts up while the spinner turns
     const LineEditor* filterEditor = nullptr; ///< while a filter is being typed
     std::optional<std::string> message;       ///< in the status text's place
-    std::string note;                         ///< behind the status text
-    Origin origin;                            ///< in the title
-    std::string oldValues;                    ///< the time of values that are none of the modem's
-    std::string zone;                         ///< of the status text's time
+    std::string note; ///< behind the status text, or in the rule above it where that is too long
+    Origin origin;    ///< in the title
+    std::string oldValues; ///< the time of values that are none of the modem's
+    std::string zone;      ///< of the status text's time
     std::function<void(const KeyEvent&)> press = [](const KeyEvent&) {}; ///< by a click
 };
 
@@ -48,8 +48,7 @@ private:
     void drawTitle(TerminalNavigation& navigation, TerminalTable& table, const Origin& origin);
     void drawBreadcrumbs(TerminalNavigation& navigation, int right);
     void drawUpperRule(const TerminalTable& table, const PaneStatus& status);
-    void drawLowerRule(const TerminalTable& table, std::size_t windowRows,
-                       const PaneStatus& status);
+    int drawLowerRule(const TerminalTable& table, std::size_t windowRows, const PaneStatus& status);
     int drawHiddenRows(int y, std::string_view mark, std::size_t rows, Key key,
                        const PaneStatus& status);
     void drawRows(TerminalTable& table);
@@ -59,11 +58,11 @@ private:
     void drawLabel(const ui::Label& label, int x, int y, Style style, Span clip,
                    std::string_view filter);
     void drawToolbar(const TerminalNavigation& navigation, const TerminalTable& table,
-                     const PaneStatus& status);
+                     const PaneStatus& status, int ruleRight);
     void drawFilterPrompt(const LineEditor& editor, const PaneStatus& status);
     void drawHint(int left, std::string_view text, const KeyEvent& key, const PaneStatus& status);
     int drawCutInFront(int x, int y, std::string_view text);
-    int drawStatus(const ui::BarItems& items, const PaneStatus& status);
+    int drawStatus(const ui::BarItems& items, const PaneStatus& status, int ruleRight);
     void drawHints(const ui::BarItems& items, const TerminalTable& table, int from,
                    const PaneStatus& status);
 

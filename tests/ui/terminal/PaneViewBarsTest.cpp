@@ -72,6 +72,25 @@ TEST_F(PaneViewBarsTest, ANoteStandsBehindTheStatus) {
     EXPECT_EQ(styleAt(33, 11), Style{.dim = true});
 }
 
+TEST_F(PaneViewBarsTest, ANoteThatDoesNotFitBehindTheStatusStandsInTheRuleAboveIt) {
+    stage.tick(display());
+    stage.frontEnd.setNote("End of the recording");
+    stage.frontEnd.resize(54, 8);
+    EXPECT_EQ(stage.line(7), " Updated 2023-11-14 at 22:13:20  End of the recording");
+    EXPECT_EQ(stage.screen(40, 8), R"(
+ Pallax
+ ──────────────────────────────────────
+▌Serving Cell Measurements             ›
+ Measured Neighbor Cells             3 ›
+ Empty List                            ›
+ SIM Info                              ›
+ End of the recording ─────────── ↓ 1 ─
+ Updated 2023-11-14 at 22:13:20  ? help
+)");
+    stage.frontEnd.resize(20, 8);
+    EXPECT_EQ(stage.line(6), " End of the r ↓ 1 ─");
+}
+
 TEST_F(PaneViewBarsTest, TheStatusTextsTimeNamesItsZone) {
     stage.zone = "+0200";
     stage.frontEnd.resize(40, 12);
