@@ -5,7 +5,6 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
 #include <array>
 #include <chrono>
 #include <csignal>
@@ -85,11 +84,14 @@ std::string onTerminal(const std::vector<std::string>& blocks) {
         output.text() += block;
         output.flush();
     }
-    std::array<char, 1000> read{};
-    const ssize_t length = ::read(terminal, read.data(), read.size());
     ::close(program);
+    std::string shown;
+    std::array<char, 1000> read{};
+    for (ssize_t length = 0; (length = ::read(terminal, read.data(), read.size())) > 0;) {
+        shown.append(read.data(), static_cast<std::size_t>(length));
+    }
     ::close(terminal);
-    return {read.data(), static_cast<std::size_t>(std::max<ssize_t>(length, 0))};
+    return shown;
 }
 
 TEST(Output, ATerminalGetsWhatCommandsItAsEscapes) {

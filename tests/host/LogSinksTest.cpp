@@ -4,7 +4,6 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
 #include <pty.h>
 #include <unistd.h>
 
@@ -60,11 +59,13 @@ TEST(FileSink, ATerminalInItsPlaceGetsNoTextAsACommand) {
         (*sink)->append("\x9B\n");
         EXPECT_TRUE((*sink)->flush());
     }
-    char read[100] = {};
-    const ssize_t length = ::read(terminal, read, sizeof read);
-    EXPECT_EQ(std::string(read, static_cast<std::size_t>(std::max<ssize_t>(length, 0))),
-              "<4>name: \\x1B]0;owned\\x07\r\n<4>\\u009B\r\n");
     ::close(program);
+    std::string shown;
+    char read[100] = {};
+    for (ssize_t length = 0; (length = ::read(terminal, read, sizeof read)) > 0;) {
+        shown.append(read, static_cast<std::size_t>(length));
+    }
+    EXPECT_EQ(shown, "<4>name: \\x1B]0;owned\\x07\r\n<4>\\u009B\r\n");
     ::close(terminal);
 }
 
