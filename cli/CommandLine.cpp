@@ -160,6 +160,9 @@ ParsedOptions CommandLine::chosen() const {
         !refusal.empty()) {
         return wrongUsage(refusal, "service");
     }
+    if (_app->got_subcommand("record") && _record.files.path.empty()) {
+        return wrongUsage("FILE is an empty name", "record");
+    }
     if (_record.files.path == "-" && _record.files.rotates()) {
         return wrongUsage("standard output is one recording, without --rotate-size and "
                           "--rotate-seconds",

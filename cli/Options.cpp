@@ -38,14 +38,16 @@ constexpr const char* kDecodeFooter = R"(Examples:
   pallax decode --system-log drive.log drive.pcap
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
-standard input; a recording may be a named pipe. On a terminal, what takes more
-than two seconds shows how far it has come, and characters that could command
-the terminal stand as escapes (\x1B, \u202E); files and pipes get CSV as the
-modem sent it.
+standard input; a recording may be a named pipe. What comes through a pipe is
+written as it comes, and then the recordings are decoded one by one. On a
+terminal, what takes more than two seconds shows how far it has come, and
+characters that could command the terminal stand as escapes (\x1B, \u202E);
+files and pipes get CSV as the modem sent it.
 
 Exit status:
   0   success, also when nobody reads the output any more
-  1   failure: a recording cannot be read to its end, or the output be written
+  1   failure: a recording or a display template cannot be read, or the output
+      not be written
   2   wrong usage
   70  with --strict: ended by a fatal record)";
 
@@ -55,12 +57,18 @@ constexpr const char* kRecordFooter = R"(Examples:
   pallax record - | ssh desk pallax service --relay -
 
 With --rotate-size or --rotate-seconds the files are drive-0001.pcapng,
-drive-0002.pcapng, ... Recording ends with Ctrl-C, and with the source. A viewer
-may run at the same time. Where no service runs, it says so and waits for one.
+drive-0002.pcapng, ... up to 9999. Recording ends with Ctrl-C, and with the
+source. A viewer may run at the same time. Where no service runs, it says so and
+waits for one.
+
+A file holds one technology. When the modem comes back with another one, the
+recording goes on in drive-2.pcapng, or in the next number. With --overwrite an
+earlier file stays as it is until the first packet comes. A file that is removed
+or changed by others while it is being written ends the recording.
 
 Exit status:
   0   success: ended by Ctrl-C, by the source, or by the reader of the output
-  1   failure: the recording cannot be written, or the modem is another one
+  1   failure: the recording cannot be written, or holds another technology
   2   wrong usage)";
 
 void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
@@ -149,31 +157,30 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
 }
 
 void addRecord(CLI::App& app, RecordOptions& options) {
-    constexpr double kLongest = 1e9; // seconds, about 30 years
     app.add_option("FILE", options.files.path,
                    "The recording to write (pcapng; - is standard output)")
         ->required()
         ->type_name("");
     addTechnology(app, options.technology, "Refuse a modem that speaks another technology");
     const auto takeSize = [&options](const std::string& text) {
-        options.files.rotateSize = parseSize(text);
-        if (!options.files.rotateSize) {
-            throw CLI::ValidationError("--rotate-size",
-                                       "\"" + text + "\" is no size like 4096, 64k, 100M or 2G");
+        const auto size = parseSize(text);
+        if (!size) {
+            throw CLI::ValidationError("--rotate-size", size.error());
         }
+        options.files.rotateSize = *size;
     };
     app.add_option_function<std::string>("--rotate-size", takeSize,
                                          "Begin the next file before one has more bytes than that")
         ->type_name("BYTES[k|M|G]");
-    const auto takeSeconds = [&options](const double& seconds) {
-        if (!(seconds > 0 && seconds <= kLongest)) {
-            throw CLI::ValidationError("--rotate-seconds", "it takes a number above 0");
+    const auto takeSeconds = [&options](const std::string& text) {
+        const auto seconds = parseSeconds(text);
+        if (!seconds) {
+            throw CLI::ValidationError("--rotate-seconds", seconds.error());
         }
-        options.files.rotateAfter = std::chrono::duration_cast<std::chrono::nanoseconds>(
-            std::chrono::duration<double>(seconds));
+        options.files.rotateAfter = *seconds;
     };
-    app.add_option_function<double>("--rotate-seconds", takeSeconds,
-                                    "Begin the next file after so many seconds")
+    app.add_option_function<std::string>("--rotate-seconds", takeSeconds,
+                                         "Begin the next file after so many seconds")
         ->type_name("SECONDS");
     app.add_flag_callback(
         "--overwrite", [&options] { options.files.existing = PcapNgWriter::Existing::Overwrite; },

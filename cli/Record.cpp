@@ -25,7 +25,12 @@ ExitStatus record(const RecordOptions& options) {
         complain(directory.error().sentence);
         return kExitFailure;
     }
-    const auto files = RecordingFiles::open(options.files);
+    TerminalLine progress = TerminalLine::onStandardError();
+    const auto files =
+        RecordingFiles::open(options.files, [&progress](const std::string& sentence) {
+            progress.wipe();
+            complain(sentence);
+        });
     if (!files && files.error().readerHasGone) {
         return kExitSuccess;
     }
@@ -33,7 +38,6 @@ ExitStatus record(const RecordOptions& options) {
         complain(files.error().sentence);
         return kExitFailure;
     }
-    TerminalLine progress = TerminalLine::onStandardError();
     std::optional<std::string> failure;
     {
         Recorder recorder(
@@ -46,6 +50,9 @@ ExitStatus record(const RecordOptions& options) {
         failure = recorder.run();
     }
     progress.leave();
+    if (const auto error = failure ? std::nullopt : (*files)->check()) {
+        failure = Recorder::failureText(*error, **files);
+    }
     if ((*files)->tooLarge() > 0) {
         complain(formatText("%llu packets of more than %zu bytes were left out.",
                             {(*files)->tooLarge(), PcapNgWriter::kLargestPacket}));
@@ -53,6 +60,9 @@ ExitStatus record(const RecordOptions& options) {
     if (failure) {
         complain(*failure);
         return kExitFailure;
+    }
+    if ((*files)->packets() == 0 && options.files.path != "-") {
+        complain("No packet came, so nothing is recorded.");
     }
     return kExitSuccess;
 }

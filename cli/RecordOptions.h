@@ -1,7 +1,9 @@
 #pragma once
 
 #include "cli/RecordingFiles.h"
+#include "platform/Result.h"
 
+#include <chrono>
 #include <cstdint>
 #include <optional>
 #include <string>
@@ -17,7 +19,11 @@ struct RecordOptions {
     std::optional<int> logLevel; ///< system-log lines up to it go to standard error
 };
 
-/// "4096", "64k", "100M", "2G": bytes, in powers of 1024. Nothing for anything else, and for 0.
-std::optional<std::uint64_t> parseSize(const std::string& text);
+/// "4096", "64k", "100M", "2G": bytes, in powers of 1024. For anything else, and for 0, what is
+/// wrong with it.
+Result<std::uint64_t, std::string> parseSize(const std::string& text);
+
+/// "0.5", "3600": above 0 and up to 1000000000; else what is wrong with it.
+Result<std::chrono::nanoseconds, std::string> parseSeconds(const std::string& text);
 
 } // namespace pallax

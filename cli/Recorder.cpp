@@ -88,7 +88,7 @@ void Recorder::packetArrived(Bytes packet) {
     if (error && error->readerHasGone) {
         stop();
     } else if (error) {
-        fail(formatText("%@ %llu packets are recorded.", {error->sentence, _files.packets()}));
+        fail(failureText(*error, _files));
     }
 }
 
@@ -108,6 +108,10 @@ void Recorder::tellProgress() {
     const std::uint64_t packets = _files.packets();
     _progress(
         progressText(_files, packets - std::exchange(_packetsTold, packets), _model.isConnected()));
+}
+
+std::string Recorder::failureText(const HostError& error, const RecordingFiles& files) {
+    return formatText("%@ %llu packets are recorded.", {error.sentence, files.packets()});
 }
 
 std::string Recorder::progressText(const RecordingFiles& files, std::uint64_t packetsPerSecond,

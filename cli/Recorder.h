@@ -34,6 +34,8 @@ public:
     /// nothing, or the failure's sentence.
     std::optional<std::string> run();
 
+    /// The error's sentence, and how many packets are recorded all the same.
+    static std::string failureText(const HostError& error, const RecordingFiles& files);
     /// "120 packets, 4800 bytes, 50 packets/s", or that there is no modem yet.
     static std::string progressText(const RecordingFiles& files, std::uint64_t packetsPerSecond,
                                     bool isConnected);

@@ -7,6 +7,7 @@
 #include <cerrno>
 #include <cstring>
 #include <fcntl.h>
+#include <sys/file.h>
 #include <sys/stat.h>
 
 // A block of a pcapng file is its type, its whole length, its body, which is padded to a multiple
@@ -100,66 +101,112 @@ ByteBuffer sectionHeader() {
 Result<std::unique_ptr<PcapNgWriter>, HostError> PcapNgWriter::create(const std::string& path,
                                                                       Existing existing) {
     constexpr mode_t kMode = S_IRUSR | S_IWUSR | S_IRGRP | S_IROTH;
+    constexpr int kFlags = O_WRONLY | O_CREAT | O_CLOEXEC;
     const bool toOutput = path == "-";
-    const int always = O_WRONLY | O_CREAT | O_CLOEXEC;
-    const int flags = always | (existing == Existing::Keep ? O_EXCL : O_TRUNC);
-    Descriptor file(toOutput ? -1 : ::open(path.c_str(), flags, kMode));
+    Descriptor file(toOutput ? -1 : ::open(path.c_str(), kFlags | O_EXCL, kMode));
+    const bool isNew = static_cast<bool>(file);
+    if (!toOutput && !isNew && errno == EEXIST) {
+        if (existing == Existing::Keep) {
+            return HostError{formatText("%@ exists already; --overwrite replaces it.", {path})};
+        }
+        file = Descriptor(::open(path.c_str(), kFlags, kMode));
+    }
     if (!toOutput && !file) {
-        return errno == EEXIST
-                   ? HostError{formatText("%@ exists already; --overwrite replaces it.", {path})}
-                   : unwritableRecording(path, errno);
+        return unwritableRecording(path, errno);
     }
     const int number = toOutput ? STDOUT_FILENO : file.number();
     std::unique_ptr<PcapNgWriter> writer(
         new PcapNgWriter(toOutput ? "standard output" : path, std::move(file), number));
-    if (auto error = writer->put(sectionHeader())) {
-        if (!toOutput && existing == Existing::Keep) {
-            (void)::unlink(path.c_str()); // made here, and no recording
-        }
+    if (auto error = writer->open(isNew)) {
         return std::move(*error);
     }
     return writer;
 }
 
-Result<std::uint32_t, HostError> PcapNgWriter::interfaceFor(int linkType, std::string_view name) {
-    const auto found = _interfaces.find(name);
-    if (found != _interfaces.end()) {
-        return found->second;
+/// What there is nothing to lose of is begun at once, which also shows that it can be written.
+std::optional<HostError> PcapNgWriter::open(bool isNew) {
+    struct stat status {};
+    _isFile = _file && ::fstat(_number, &status) == 0 && S_ISREG(status.st_mode);
+    _device = status.st_dev;
+    _inode = status.st_ino;
+    if (_isFile && ::flock(_number, LOCK_EX | LOCK_NB) != 0 && errno == EWOULDBLOCK) {
+        return HostError{formatText("%@ is being written by another program.", {_name})};
+    }
+    _isNew = isNew;
+    return isNew || !_isFile ? beginSection() : std::nullopt;
+}
+
+PcapNgWriter::~PcapNgWriter() {
+    if (_isNew && _packets == 0 && sizeInPlace()) {
+        (void)::unlink(_name.c_str());
+    }
+}
+
+std::optional<HostError> PcapNgWriter::beginSection() {
+    _isBegun = true;
+    if (_isFile && ::ftruncate(_number, 0) != 0) {
+        return unwritableRecording(_name, errno);
+    }
+    return put(sectionHeader());
+}
+
+std::optional<HostError> PcapNgWriter::begin(int linkType, std::string_view name) {
+    if (auto error = _isBegun ? std::nullopt : beginSection()) {
+        return error;
     }
     const std::size_t roughSize = 32 + name.size();
-    const auto block = Block(kInterface, roughSize)
-                           .u16(static_cast<std::uint16_t>(linkType))
-                           .u16(0)
-                           .u32(kLargestPacket)
-                           .option(kInterfaceName, name)
-                           .option(kStampResolution, {&kNanoseconds, 1})
-                           .option(kEndOfOptions, {})
-                           .finish();
-    if (auto error = put(block)) {
-        return std::move(*error);
-    }
-    const auto number = static_cast<std::uint32_t>(_interfaces.size());
-    _interfaces.emplace(name, number);
-    return number;
+    return put(Block(kInterface, roughSize)
+                   .u16(static_cast<std::uint16_t>(linkType))
+                   .u16(0)
+                   .u32(kLargestPacket)
+                   .option(kInterfaceName, name)
+                   .option(kStampResolution, {&kNanoseconds, 1})
+                   .option(kEndOfOptions, {})
+                   .finish());
 }
 
 std::uint64_t PcapNgWriter::sizeOfPacket(std::size_t length) {
     return kBlockFrame + kPacketHead + padded(length);
 }
 
-std::optional<HostError> PcapNgWriter::write(std::uint32_t interface, Time time, Bytes packet) {
+std::optional<HostError> PcapNgWriter::write(Time time, Bytes packet) {
+    constexpr std::uint32_t kOnlyInterface = 0;
     constexpr unsigned kHalf = 32;
     const auto sinceEpoch = std::max<std::int64_t>(time.time_since_epoch().count(), 0);
     const auto stamp = static_cast<std::uint64_t>(sinceEpoch);
     const auto length = static_cast<std::uint32_t>(packet.size());
-    return put(Block(kEnhancedPacket, kPacketHead + packet.size())
-                   .u32(interface)
-                   .u32(static_cast<std::uint32_t>(stamp >> kHalf))
-                   .u32(static_cast<std::uint32_t>(stamp))
-                   .u32(length)
-                   .u32(length)
-                   .data(packet)
-                   .finish());
+    auto error = put(Block(kEnhancedPacket, kPacketHead + packet.size())
+                         .u32(kOnlyInterface)
+                         .u32(static_cast<std::uint32_t>(stamp >> kHalf))
+                         .u32(static_cast<std::uint32_t>(stamp))
+                         .u32(length)
+                         .u32(length)
+                         .data(packet)
+                         .finish());
+    _packets += error ? 0 : 1;
+    return error;
+}
+
+/// The size of the file to which the path leads, if that is the one that is written.
+std::optional<std::uint64_t> PcapNgWriter::sizeInPlace() const {
+    struct stat there {};
+    const bool isThere =
+        ::stat(_name.c_str(), &there) == 0 && there.st_dev == _device && there.st_ino == _inode;
+    return isThere ? std::optional(static_cast<std::uint64_t>(there.st_size)) : std::nullopt;
+}
+
+std::optional<HostError> PcapNgWriter::interference() const {
+    if (!_isFile || !_isBegun) {
+        return std::nullopt;
+    }
+    const auto size = sizeInPlace();
+    if (size == _size) {
+        return std::nullopt;
+    }
+    const std::string_view what =
+        size ? "changed by another program" : "removed, moved or replaced";
+    return HostError{
+        formatText("The recording %@ was %@ while it was being written.", {_name, what})};
 }
 
 std::optional<HostError> PcapNgWriter::put(const ByteBuffer& block) {

@@ -98,6 +98,7 @@ TEST_F(EndToEndTemplate, OfUtranNamesTheCodesToAskForSoThatARecorderNeedsItToo) 
     isRefused({"record", world.path("a.pcapng")},
               "pallax: The display templates in " + templates +
                   " cannot be listed: No such file or directory.\n");
+    EXPECT_FALSE(fs::exists(world.path("a.pcapng")));
     service.signal(SIGTERM);
     EXPECT_EQ(service.wait(), 0);
 }

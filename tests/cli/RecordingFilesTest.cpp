@@ -25,7 +25,7 @@ protected:
     }
     std::optional<HostError> add(RecordingFiles& files, seconds sinceStart,
                                  std::size_t length = 4) const {
-        return files.add(*lte, kFirstStamp + sinceStart, ByteBuffer(length));
+        return files.add(*technology, kFirstStamp + sinceStart, ByteBuffer(length));
     }
     int packetsIn(const std::string& name) const {
         const auto recording = Recording::open(folder.file(name));
@@ -45,7 +45,7 @@ protected:
     }
 
     doubles::RuntimeFolder folder;
-    const RecordedTechnology* lte = technologyOfCommandName("lte");
+    const RecordedTechnology* technology = technologyOfCommandName("lte");
 };
 
 TEST_F(RecordingFilesTest, WithoutALimitThereIsOneFileOfTheGivenName) {
@@ -148,6 +148,116 @@ TEST_F(RecordingFilesTest, WhatNoReaderWouldTakeIsLeftOutAndCounted) {
     EXPECT_EQ(packetsIn("a.pcapng"), 1);
 }
 
+TEST_F(RecordingFilesTest, AnotherTechnologyBeginsAnotherFileAndThatIsTold) {
+    std::vector<std::string> notices;
+    const auto files =
+        RecordingFiles::open(optionsFor("drive.pcapng"),
+                             [&](const std::string& sentence) { notices.push_back(sentence); });
+    folder.write("drive-3.pcapng", "precious");
+    for (const char* name : {"lte", "gsm", "gsm", "lte"}) {
+        technology = technologyOfCommandName(name);
+        ASSERT_EQ(add(**files, seconds(0)), std::nullopt) << name;
+    }
+    EXPECT_EQ(notices, (std::vector<std::string>{
+                           "The modem now speaks Zorell_GSM (gsm); recording goes on in " +
+                               folder.file("drive-2.pcapng") + ".",
+                           "The modem now speaks Zorell_LTE (lte); recording goes on in " +
+                               folder.file("drive-4.pcapng") + "."}));
+    EXPECT_EQ(packetsIn("drive.pcapng"), 1);
+    EXPECT_EQ(packetsIn("drive-2.pcapng"), 2);
+    EXPECT_EQ(packetsIn("drive-4.pcapng"), 1);
+    EXPECT_EQ(doubles::contentOf(folder.file("drive-3.pcapng")), "precious");
+    EXPECT_EQ((*files)->packets(), 4U);
+}
+
+TEST_F(RecordingFilesTest, WithALimitAnotherTechnologyTakesTheNextNumber) {
+    auto options = optionsFor("a.pcapng");
+    options.rotateAfter = seconds(10);
+    const auto files = RecordingFiles::open(options);
+    ASSERT_EQ(add(**files, seconds(0)), std::nullopt);
+    technology = technologyOfCommandName("gsm");
+    ASSERT_EQ(add(**files, seconds(1)), std::nullopt);
+    ASSERT_EQ(add(**files, seconds(10)), std::nullopt) << "its file began at 1 s";
+    ASSERT_EQ(add(**files, seconds(11)), std::nullopt);
+    EXPECT_EQ(packetsIn("a-0001.pcapng"), 1);
+    EXPECT_EQ(packetsIn("a-0002.pcapng"), 2);
+    EXPECT_EQ(packetsIn("a-0003.pcapng"), 1);
+}
+
+TEST_F(RecordingFilesTest, WhatIsNoFileCannotGoOnInAnotherOne) {
+    RecordingFiles::Options options;
+    options.path = "/dev/null";
+    options.existing = PcapNgWriter::Existing::Overwrite;
+    const auto files = RecordingFiles::open(options);
+    ASSERT_EQ(add(**files, seconds(0)), std::nullopt);
+    technology = technologyOfCommandName("gsm");
+    const auto error = add(**files, seconds(0));
+    ASSERT_TRUE(error);
+    EXPECT_EQ(error->sentence,
+              "The modem now speaks Zorell_GSM (gsm), and a recording holds one technology only.");
+    EXPECT_EQ((*files)->packets(), 1U);
+}
+
+TEST_F(RecordingFilesTest, PacketsOfAFileThatOthersInterfereWithDoNotCount) {
+    auto options = optionsFor("a.pcapng");
+    options.rotateAfter = seconds(10);
+    const auto files = RecordingFiles::open(options);
+    for (const int second : {0, 1, 10, 11, 12}) {
+        ASSERT_EQ(add(**files, seconds(second)), std::nullopt);
+    }
+    EXPECT_EQ((*files)->check(), std::nullopt);
+    folder.write("a-0002.pcapng", ""); // the next packet would leave a hole in it
+    const auto error = add(**files, seconds(13));
+    ASSERT_TRUE(error);
+    EXPECT_EQ(error->sentence, "The recording " + folder.file("a-0002.pcapng") +
+                                   " was changed by another program while it was being written.");
+    EXPECT_EQ((*files)->packets(), 2U) << "those of the first file";
+    EXPECT_EQ(doubles::contentOf(folder.file("a-0002.pcapng")), "");
+}
+
+TEST_F(RecordingFilesTest, AFileThatIsGoneAtTheEndIsTold) {
+    const auto files = RecordingFiles::open(optionsFor("a.pcapng"));
+    ASSERT_EQ(add(**files, seconds(0)), std::nullopt);
+    std::filesystem::remove(folder.file("a.pcapng"));
+    const auto error = (*files)->check();
+    ASSERT_TRUE(error);
+    EXPECT_EQ(error->sentence, "The recording " + folder.file("a.pcapng") +
+                                   " was removed, moved or replaced while it was being written.");
+    EXPECT_EQ((*files)->packets(), 0U);
+}
+
+TEST_F(RecordingFilesTest, NoNumberHasMoreThanFourDigitsSoThatNamesSort) {
+    auto options = optionsFor("a.pcapng");
+    options.rotateSize = 1;
+    for (unsigned number = 2; number < RecordingFiles::kMostParts; ++number) {
+        folder.write(
+            std::filesystem::path(RecordingFiles::numberedPath("a.pcapng", number)).string(), "");
+    }
+    const auto files = RecordingFiles::open(options);
+    ASSERT_EQ(add(**files, seconds(0)), std::nullopt);
+    ASSERT_EQ(add(**files, seconds(0)), std::nullopt);
+    EXPECT_EQ(packetsIn("a-9999.pcapng"), 1);
+    const auto error = add(**files, seconds(0));
+    ASSERT_TRUE(error);
+    EXPECT_EQ(error->sentence,
+              "The recording " + options.path + " cannot have more than 9999 files.");
+    EXPECT_EQ((*files)->packets(), 2U);
+}
+
+TEST_F(RecordingFilesTest, NumbersNeedTheNameOfAFile) {
+    for (const std::string path : {"", ".", "..", "/tmp/", "/tmp", "/dev/null"}) {
+        RecordingFiles::Options options;
+        options.path = path;
+        options.existing = PcapNgWriter::Existing::Overwrite;
+        options.rotateSize = 4096;
+        const auto files = RecordingFiles::open(options);
+        ASSERT_FALSE(files) << path;
+        EXPECT_EQ(files.error().sentence,
+                  "A recording in several files needs the name of a file, which " + path +
+                      " is not.");
+    }
+}
+
 TEST(RecordingFiles, TheNumberStandsBeforeTheExtension) {
     EXPECT_EQ(RecordingFiles::numberedPath("/x.y/drive.pcapng", 7), "/x.y/drive-0007.pcapng");
     EXPECT_EQ(RecordingFiles::numberedPath("drive", 12345), "drive-12345");
@@ -155,15 +265,33 @@ TEST(RecordingFiles, TheNumberStandsBeforeTheExtension) {
 }
 
 TEST(RecordOptions, ASizeIsANumberWithAUnit) {
-    EXPECT_EQ(parseSize("1"), 1U);
-    EXPECT_EQ(parseSize("64k"), 65536U);
-    EXPECT_EQ(parseSize("100M"), 104857600U);
-    EXPECT_EQ(parseSize("2G"), 2147483648U);
-    for (const char* wrong : {"", "0", "k", "1K", "1kk", "-1", "1.5M", "99999999999999999999",
-                              "17179869185G", " 1", "1 "}) {
-        EXPECT_EQ(parseSize(wrong), std::nullopt) << wrong;
+    EXPECT_EQ(*parseSize("1"), 1U);
+    EXPECT_EQ(*parseSize("64k"), 65536U);
+    EXPECT_EQ(*parseSize("100M"), 104857600U);
+    EXPECT_EQ(*parseSize("2G"), 2147483648U);
+    EXPECT_EQ(*parseSize("17179869183G"), 18446744072635809792U);
+    for (const std::string wrong : {"", "k", "1K", "1kk", "-1", "1.5M", " 1", "1 "}) {
+        EXPECT_EQ(parseSize(wrong).error(),
+                  "\"" + wrong + "\" is no size like 4096, 64k, 100M or 2G");
     }
-    EXPECT_EQ(parseSize("17179869183G"), 18446744072635809792U);
+    for (const std::string far : {"0", "0k", "99999999999999999999", "17179869184G"}) {
+        EXPECT_EQ(parseSize(far).error(),
+                  "\"" + far + "\" is out of range, which is from 1 to 17179869183G");
+    }
+}
+
+TEST(RecordOptions, SecondsAreANumberAbove0) {
+    using std::chrono::nanoseconds;
+    EXPECT_EQ(*parseSeconds("1.5"), std::chrono::milliseconds(1500));
+    EXPECT_EQ(*parseSeconds("1e9"), seconds(1'000'000'000));
+    EXPECT_EQ(*parseSeconds("1e-30"), nanoseconds(1)) << "never 0";
+    for (const std::string wrong : {"", "x", "nan", "1s", " 1"}) {
+        EXPECT_EQ(parseSeconds(wrong).error(), "\"" + wrong + "\" is no number of seconds");
+    }
+    for (const std::string far : {"0", "-1", "1000000001", "inf", "1e999"}) {
+        EXPECT_EQ(parseSeconds(far).error(),
+                  "\"" + far + "\" is out of range, which is above 0 and up to 1000000000");
+    }
 }
 
 } // namespace

@@ -15,6 +15,7 @@
 #include <cstdio>
 #include <fcntl.h>
 #include <filesystem>
+#include <functional>
 #include <sys/resource.h>
 #include <unistd.h>
 
@@ -35,8 +36,11 @@ protected:
     }
     /// Writes the bytes as an LTE packet.
     static std::optional<HostError> write(PcapNgWriter& writer, const ByteBuffer& bytes) {
-        const auto interface = writer.interfaceFor(kZorellLte, "Zorell_LTE");
-        return interface ? writer.write(*interface, kStamp, bytes) : interface.error();
+        const auto error = writer.packets() == 0 ? begin(writer) : std::nullopt;
+        return error ? error : writer.write(kStamp, bytes);
+    }
+    static std::optional<HostError> begin(PcapNgWriter& writer) {
+        return writer.begin(kZorellLte, "Zorell_LTE");
     }
     /// How many packets the file has, as its reader finds; -1 when it is damaged.
     int packetsIn() const {
@@ -94,12 +98,12 @@ TEST_F(PcapNgWriterTest, IsReadBackToTheNanosecondWhileItIsBeingWritten) {
 TEST_F(PcapNgWriterTest, WhateverIsWrittenIsReadBack) {
     EXPECT_TRUE(rc::check([this](const std::vector<std::vector<std::uint8_t>>& packets) {
         const auto writer = create(Existing::Overwrite);
-        const auto interface = writer->interfaceFor(kZorellLte, "Zorell_LTE");
+        RC_ASSERT(!begin(*writer));
         std::vector<Time> times;
         for (const auto& packet : packets) {
             const auto stamp = *rc::gen::inRange<std::int64_t>(0, std::int64_t{1} << 62U);
             times.emplace_back(std::chrono::nanoseconds(stamp));
-            RC_ASSERT(!writer->write(*interface, times.back(), packet));
+            RC_ASSERT(!writer->write(times.back(), packet));
         }
         RC_ASSERT(writer->size() == std::filesystem::file_size(path));
         const auto recording = Recording::open(path);
@@ -115,35 +119,10 @@ TEST_F(PcapNgWriterTest, WhateverIsWrittenIsReadBack) {
     }));
 }
 
-TEST_F(PcapNgWriterTest, ATechnologyIsOneInterface) {
-    const auto writer = create();
-    EXPECT_EQ(*writer->interfaceFor(148, "Zorell_GSM"), 0U);
-    EXPECT_EQ(*writer->interfaceFor(kZorellLte, "Zorell_LTE"), 1U);
-    const auto size = static_cast<std::size_t>(writer->size());
-    EXPECT_EQ(*writer->interfaceFor(148, "Zorell_GSM"), 0U);
-    EXPECT_EQ(writer->size(), size) << "written once";
-    ASSERT_EQ(writer->write(1, kStamp, {}), std::nullopt);
-    ASSERT_EQ(writer->write(0, kStamp, {}), std::nullopt);
-    using namespace std::string_literals;
-    const auto interface = [](std::string_view linkType, std::string_view name) {
-        return "\x01\0\0\0\x30\0\0\0"s.append(linkType) +
-               "\0\0\0\0\0\x04\0\x02\0\x0A\0"s.append(name) +
-               "\0\0\x09\0\x01\0\x09\0\0\0\0\0\0\0\x30\0\0\0"s;
-    };
-    const auto packet = [](std::string_view number) {
-        return "\x06\0\0\0\x20\0\0\0"s.append(number) +
-               "\0\0\0\xFE\x9C\x97\x17\x15\xCD\x85\x3D\0\0\0\0\0\0\0\0\x20\0\0\0"s;
-    };
-    constexpr std::size_t kSectionHeader = 44;
-    EXPECT_EQ(doubles::contentOf(path).substr(kSectionHeader),
-              interface("\x94"s, "Zorell_GSM") + interface("\x96"s, "Zorell_LTE") +
-                  packet("\x01"s) + packet("\0"s));
-}
-
 TEST_F(PcapNgWriterTest, ATimeBefore1970IsWrittenAs1970) {
     const auto writer = create();
-    const auto interface = writer->interfaceFor(kZorellLte, "Zorell_LTE");
-    ASSERT_EQ(writer->write(*interface, Time(std::chrono::seconds(-5)), {}), std::nullopt);
+    ASSERT_EQ(begin(*writer), std::nullopt);
+    ASSERT_EQ(writer->write(Time(std::chrono::seconds(-5)), {}), std::nullopt);
     EXPECT_EQ((*Recording::open(path))->next()->time, Time());
 }
 
@@ -155,6 +134,79 @@ TEST_F(PcapNgWriterTest, AFileThatExistsIsKeptUnlessToldOtherwise) {
     EXPECT_EQ(doubles::contentOf(path), "precious");
     ASSERT_EQ(write(*create(Existing::Overwrite), {1}), std::nullopt);
     EXPECT_EQ(packetsIn(), 1);
+}
+
+TEST_F(PcapNgWriterTest, AnEarlierFileIsReplacedByTheFirstPacketAndNotBefore) {
+    const std::string earlier(1000, 'x');
+    folder.write("a.pcapng", earlier);
+    {
+        const auto writer = create(Existing::Overwrite);
+        EXPECT_EQ(doubles::contentOf(path), earlier);
+    }
+    EXPECT_EQ(doubles::contentOf(path), earlier) << "no packet came";
+    const auto writer = create(Existing::Overwrite);
+    ASSERT_EQ(write(*writer, {1}), std::nullopt);
+    EXPECT_EQ(packetsIn(), 1);
+    EXPECT_EQ(std::filesystem::file_size(path), writer->size());
+}
+
+TEST_F(PcapNgWriterTest, AFileThatGetsNoPacketIsRemoved) {
+    {
+        const auto writer = create();
+        EXPECT_TRUE(std::filesystem::exists(path)) << "the name is taken from the start";
+        ASSERT_EQ(begin(*writer), std::nullopt);
+    }
+    EXPECT_FALSE(std::filesystem::exists(path));
+    ASSERT_EQ(write(*create(), {1}), std::nullopt);
+    EXPECT_EQ(packetsIn(), 1);
+}
+
+TEST_F(PcapNgWriterTest, AFileOfAnotherInItsPlaceIsNotRemoved) {
+    {
+        const auto writer = create();
+        std::filesystem::remove(path);
+        folder.write("a.pcapng", "another's");
+    }
+    EXPECT_EQ(doubles::contentOf(path), "another's");
+}
+
+TEST_F(PcapNgWriterTest, AFileThatIsBeingWrittenTakesNoSecondWriter) {
+    const std::string sentence = path + " is being written by another program.";
+    {
+        const auto first = create();
+        EXPECT_EQ(PcapNgWriter::create(path, Existing::Overwrite).error().sentence, sentence);
+        ASSERT_EQ(write(*first, {1}), std::nullopt);
+        EXPECT_EQ(PcapNgWriter::create(path, Existing::Overwrite).error().sentence, sentence);
+        ASSERT_EQ(write(*first, {2}), std::nullopt);
+        EXPECT_EQ(packetsIn(), 2);
+    }
+    EXPECT_TRUE(PcapNgWriter::create(path, Existing::Overwrite));
+    const auto device = PcapNgWriter::create("/dev/null", Existing::Overwrite);
+    EXPECT_TRUE(PcapNgWriter::create("/dev/null", Existing::Overwrite)) << "no file, no lock";
+    EXPECT_FALSE((*device)->isFile());
+}
+
+TEST_F(PcapNgWriterTest, InterferenceWithTheFileIsTold) {
+    const auto interferenceAfter = [this](const std::function<void()>& what) {
+        std::filesystem::remove_all(path);
+        const auto writer = create();
+        EXPECT_EQ(writer->interference(), std::nullopt);
+        EXPECT_EQ(write(*writer, {1}), std::nullopt);
+        EXPECT_EQ(writer->interference(), std::nullopt);
+        what();
+        const auto told = writer->interference();
+        return told ? told->sentence : "";
+    };
+    const std::string gone =
+        "The recording " + path + " was removed, moved or replaced while it was being written.";
+    EXPECT_EQ(interferenceAfter([this] { std::filesystem::remove(path); }), gone);
+    EXPECT_EQ(interferenceAfter([this] { std::filesystem::rename(path, folder.file("b")); }), gone);
+    EXPECT_EQ(interferenceAfter(
+                  [this] { std::filesystem::rename(folder.write("c", "another's"), path); }),
+              gone);
+    EXPECT_EQ(interferenceAfter([this] { folder.write("a.pcapng", ""); }),
+              "The recording " + path +
+                  " was changed by another program while it was being written.");
 }
 
 TEST_F(PcapNgWriterTest, AFileThatCannotBeMadeIsAClearFailure) {
