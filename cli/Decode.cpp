@@ -178,14 +178,16 @@ ExitStatus decodeAtOnce(const DecodeOptions& options, DecodeProgress& progress, 
     return collector.status();
 }
 
-/// How many processes decode. A stream may be live: what it gives must not wait for its end.
+/// How many processes decode. A stream may be live: what it gives must not wait for its end, unless
+/// the user says how many.
 unsigned jobsFor(const DecodeOptions& options) {
     const auto& recordings = options.recordings;
     if (recordings.size() < 2 ||
-        std::any_of(recordings.begin(), recordings.end(), RecordingFile::isStream)) {
+        std::find(recordings.begin(), recordings.end(), "-") != recordings.end()) {
         return 1;
     }
-    return options.jobs.value_or(std::thread::hardware_concurrency());
+    const bool isLive = std::any_of(recordings.begin(), recordings.end(), RecordingFile::isStream);
+    return options.jobs.value_or(isLive ? 1 : std::thread::hardware_concurrency());
 }
 
 ExitStatus decodeAll(const DecodeOptions& options, FileSink* log) {

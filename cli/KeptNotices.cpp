@@ -10,7 +10,7 @@ KeptNotices::~KeptNotices() {
     }
     try {
         _write(_lines);
-    } catch (const std::exception&) { // NOLINT(bugprone-empty-catch): the terminal has gone
+    } catch (const std::exception&) { // the terminal has gone
     }
 }
 

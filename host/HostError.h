@@ -15,8 +15,8 @@ struct HostError {
 
 /// That a recording cannot be written, as the system's error number tells.
 HostError unwritableRecording(std::string_view name, int error);
-/// That the reader of a recording does not take it, although the program has to end; `isWhole` where
-/// it has got whole packets.
+/// That the reader of a recording does not take it, although the program has to end; `isWhole`
+/// where it has got whole packets.
 HostError untakenRecording(std::string_view name, bool isWhole);
 
 } // namespace pallax

@@ -26,7 +26,6 @@ protected:
         address.sun_family = AF_UNIX;
         const std::string path = world.path("log");
         std::copy(path.begin(), path.end(), std::begin(address.sun_path));
-        // NOLINTNEXTLINE(cppcoreguidelines-pro-type-reinterpret-cast): as sockets take addresses
         EXPECT_EQ(
             ::bind(socket.number(), reinterpret_cast<const sockaddr*>(&address), sizeof address),
             0);

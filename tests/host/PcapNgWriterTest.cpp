@@ -272,9 +272,11 @@ protected:
 
     /// Writes packets of that size until one is not taken.
     HostError errorOfPackets(std::size_t size) const {
-        const auto interface = writer->interfaceFor(kZorellLte, "Zorell_LTE");
-        for (int count = 0; interface && count < 1000; ++count) {
-            if (auto error = writer->write(*interface, kStamp, ByteBuffer(size))) {
+        if (auto error = writer->begin(kZorellLte, "Zorell_LTE")) {
+            return std::move(*error);
+        }
+        for (int count = 0; count < 1000; ++count) {
+            if (auto error = writer->write(kStamp, ByteBuffer(size))) {
                 return std::move(*error);
             }
         }

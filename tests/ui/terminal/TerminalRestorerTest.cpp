@@ -4,14 +4,17 @@
 
 #include <algorithm>
 #include <array>
+#include <chrono>
 #include <csignal>
 #include <cstdlib>
 #include <fcntl.h>
 #include <functional>
+#include <poll.h>
 #include <string>
 #include <sys/resource.h>
 #include <sys/wait.h>
 #include <termios.h>
+#include <thread>
 #include <unistd.h>
 
 namespace pallax::terminal {
@@ -43,8 +46,16 @@ protected:
         (void)::tcsetattr(descriptor, TCSANOW, &modes);
     }
 
-    /// As the user's Ctrl-S.
-    void stop() const { EXPECT_EQ(::write(master, "\x13", 1), 1); }
+    /// As the user's Ctrl-S, which takes effect a moment later.
+    void stop() const {
+        EXPECT_EQ(::write(master, "\x13", 1), 1);
+        pollfd room{terminal, POLLOUT, 0};
+        constexpr int kMostLooks = 10'000;
+        for (int looks = 0; looks<kMostLooks&& ::poll(&room, 1, 0)> 0; ++looks) {
+            std::this_thread::sleep_for(std::chrono::milliseconds(1));
+        }
+        EXPECT_EQ(::poll(&room, 1, 0), 0) << "it is not stopped";
+    }
 
     /// Runs a process that does `action`, and returns the signal that it died of; 0 if it did not.
     int signalAfter(const std::function<void()>& action) const {
