@@ -1,5 +1,6 @@
 #include "platform/XmlWritable.h"
 
+#include "platform/Format.h"
 #include "platform/Printable.h"
 #include "platform/PropertyListCodec.h"
 #include "platform/Utf8.h"
@@ -63,7 +64,9 @@ private:
         std::optional<Array> changed;
         for (std::size_t index = 0; index < elements.size(); ++index) {
             if (auto element = of(elements[index], path + "/" + std::to_string(index), depth + 1)) {
-                changed = changed ? std::move(changed) : std::optional(elements);
+                if (!changed) {
+                    changed = elements;
+                }
                 (*changed)[index] = std::move(*element);
             }
         }
@@ -81,7 +84,7 @@ private:
             auto key = writableText(entry.key.view());
             if (key) {
                 while (entries.contains(*key) || copy.contains(*key)) {
-                    *key += kReplacementCharacter; // no entry takes another one's place
+                    *key += formatText(" (%zu)", {copy.size() + 1}); // no entry replaces another
                 }
             }
             const std::string place = path + "/" + (key ? *key : std::string(entry.key.view()));
