@@ -39,10 +39,10 @@ constexpr const char* kDecodeFooter = R"(Examples:
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
 standard input; a recording may be a named pipe. What comes through a pipe is
-written as it comes, and then the recordings are decoded one by one. On a
-terminal, what takes more than two seconds shows how far it has come, and
-characters that could command the terminal stand as escapes (\x1B, \u202E);
-files and pipes get CSV as the modem sent it.
+written as it comes; recordings are then decoded one by one unless --jobs says
+otherwise. On a terminal, what takes more than two seconds shows how far it has
+come, and characters that could command the terminal stand as escapes (\x1B,
+\u202E); files and pipes get CSV as the modem sent it.
 
 Exit status:
   0   success, also when nobody reads the output any more

@@ -61,9 +61,6 @@ ExitStatus record(const RecordOptions& options) {
         complain(*failure);
         return kExitFailure;
     }
-    if ((*files)->packets() == 0 && options.files.path != "-") {
-        complain("No packet came, so nothing is recorded.");
-    }
     return kExitSuccess;
 }
 

@@ -58,7 +58,6 @@ TEST_F(EndToEndRecordFiles, WithoutAPacketStayAsTheyWere) {
         EXPECT_TRUE(recorder.says("<3>Could not create the ports necessary\n"));
         recorder.signal(SIGINT);
         EXPECT_EQ(recorder.wait(), 0);
-        EXPECT_TRUE(recorder.err().ends_with("pallax: No packet came, so nothing is recorded.\n"));
     }
     EXPECT_EQ(contentOf(earlier), content);
     EXPECT_FALSE(fs::exists(world.path("new.pcapng")));
