@@ -116,7 +116,8 @@ TEST_F(EndToEndSteps, OneStampAnHourAheadLeavesTheTicksOfTheOthers) {
     std::vector<Packet> packets;
     for (int count = 0; count < 240; ++count) { // two minutes
         const seconds ahead(count == 9 ? 3600 : 0);
-        packets.emplace_back(milliseconds(500) * count + ahead, registration(count % 2 * 2U));
+        packets.emplace_back(milliseconds(500) * count + ahead,
+                             registration(count % 2 == 0 ? 0 : 2));
     }
     const std::string recording = record("a.pcap", packets);
     const Lines decoded = decodedTicks(recording);
