@@ -178,16 +178,16 @@ ExitStatus decodeAtOnce(const DecodeOptions& options, DecodeProgress& progress, 
     return collector.status();
 }
 
-/// How many processes decode. A stream may be live: what it gives must not wait for its end, unless
-/// the user says how many.
+/// How many processes decode. What a live recording gives must not wait for its end; but several
+/// pipes may have one writer, which waits until all of them are opened.
 unsigned jobsFor(const DecodeOptions& options) {
     const auto& recordings = options.recordings;
     if (recordings.size() < 2 ||
-        std::find(recordings.begin(), recordings.end(), "-") != recordings.end()) {
+        std::find(recordings.begin(), recordings.end(), "-") != recordings.end() ||
+        std::count_if(recordings.begin(), recordings.end(), RecordingFile::isStream) == 1) {
         return 1;
     }
-    const bool isLive = std::any_of(recordings.begin(), recordings.end(), RecordingFile::isStream);
-    return options.jobs.value_or(isLive ? 1 : std::thread::hardware_concurrency());
+    return options.jobs.value_or(std::thread::hardware_concurrency());
 }
 
 ExitStatus decodeAll(const DecodeOptions& options, FileSink* log) {

@@ -39,15 +39,14 @@ constexpr const char* kDecodeFooter = R"(Examples:
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
 standard input; a recording may be a named pipe. What comes through a pipe is
-written as it comes; recordings are then decoded one by one unless --jobs says
-otherwise. On a terminal, what takes more than two seconds shows how far it has
+written as it comes; several pipes are read at once and written one after the
+other. On a terminal, what takes more than two seconds shows how far it has
 come, and characters that could command the terminal stand as escapes (\x1B,
 \u202E); files and pipes get CSV as the modem sent it.
 
 Exit status:
   0   success, also when nobody reads the output any more
-  1   failure: a recording or a display template cannot be read, or the output
-      not be written
+  1   failure: a recording or template cannot be read, or the output be written
   2   wrong usage
   70  with --strict: ended by a fatal record)";
 

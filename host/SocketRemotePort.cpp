@@ -76,9 +76,9 @@ struct SocketRemotePort::State : std::enable_shared_from_this<State> {
 /// Takes what has arrived, or, of a peer that never stops, so much that others get their turn and
 /// a deadline is looked at; false when the connection has ended.
 bool SocketRemotePort::State::receive() {
-    constexpr std::size_t kChunkSize = std::size_t{16} << 10U;
+    constexpr std::size_t kPieceSize = std::size_t{16} << 10U;
     constexpr int kMostChunks = 16;
-    std::array<std::uint8_t, kChunkSize> chunk; // NOLINT: filled by the call below
+    std::array<std::uint8_t, kPieceSize> chunk; // NOLINT: filled by the call below
     for (int count = 0; count < kMostChunks; ++count) {
         const Transfer transfer = receiveFrom(socket, chunk);
         if (transfer.state == Transfer::State::WouldBlock) {

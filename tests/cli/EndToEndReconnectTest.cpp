@@ -132,7 +132,8 @@ TEST_F(EndToEndReconnect, WhereTheSettingSaysSoTheDisplayStartsAfreshAfterARecon
     EXPECT_TRUE(viewer.says("Connecting...\n"));
     PallaxProcess again(world, serviceOf("second.pcap", 0));
     EXPECT_TRUE(viewer.says("  MM Service State: REG_STATE_INACTIVE\n"));
-    EXPECT_EQ(viewer.err(), "pallax: The link was restarted: the display starts afresh.\n");
+    EXPECT_EQ(viewer.err(), "pallax: No telephony service is running; waiting.\n"
+                            "pallax: The link was restarted: the display starts afresh.\n");
     EXPECT_EQ(viewer.out().find('*'), std::string::npos) << "its first block is a first one";
     end(viewer);
     end(again);
