@@ -52,6 +52,9 @@ TEST_F(RequiredTemplatesTest, AmongWhichThereIsNoneForUtranAreNone) {
 }
 
 TEST_F(RequiredTemplatesTest, WithoutDescriptorsAreNotTakenForMissing) {
+#ifdef PALLAX_SANITIZED
+    GTEST_SKIP() << "the sanitizer needs descriptors itself";
+#endif
     (void)folder.write("LTE.plist", "{}");
     (void)folder.write("UTRAN.plist", "{}");
     rlimit before{};
