@@ -33,8 +33,8 @@ enum class StampForm { Pcap, PcapNg };
 class PcapRecording final : public Recording {
 public:
     PcapRecording(std::string name, pcap_t* capture, StampForm form, bool isStream)
-        : _name(std::move(name)), _capture(capture), _linkType(pcap_datalink(capture)),
-          _form(form), _isStream(isStream) {}
+        : _name(std::move(name)), _capture(capture), _linkType(pcap_datalink(capture)), _form(form),
+          _isStream(isStream) {}
     ~PcapRecording() override { pcap_close(_capture); }
     PcapRecording(const PcapRecording&) = delete;
     PcapRecording& operator=(const PcapRecording&) = delete;
