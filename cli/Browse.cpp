@@ -17,7 +17,6 @@
 #include "ui/terminal/TerminalRestorer.h"
 
 #include <algorithm>
-#include <filesystem>
 #include <memory>
 #include <stdexcept>
 #include <unistd.h>
@@ -43,15 +42,15 @@ struct Request {
     bool isOnScreen;
 };
 
-/// What is browsed, for sentences about it.
-std::string sourceName(const BrowseOptions& options) {
+BrowsedSource sourceOf(const BrowseOptions& options) {
     if (options.simulation) {
-        return "the simulation";
+        return {"simulated " + std::string(options.simulation->technology->commandName)};
     }
     if (!options.recording) {
-        return "the service";
+        return {"live modem"};
     }
-    return options.recording == "-" ? "standard input" : *options.recording;
+    return {*options.recording == "-" ? "standard input" : *options.recording,
+            RecordingFile::isStream(*options.recording)};
 }
 
 /// False when the child (null where the machine's own service is asked) ended too early.
@@ -60,7 +59,8 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     bool isWhole = false;
     try {
         PrintBrowser browser(std::move(directory), request.onFatalRecord, child,
-                             request.settings.afterReconnect, output, sourceName(request.options));
+                             request.settings.afterReconnect, output,
+                             sourceOf(request.options).name);
         isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // what was printed, and the generators' last words
@@ -68,19 +68,6 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     }
     output.flush();
     return isWhole;
-}
-
-ScreenBrowser::Source sourceOf(const BrowseOptions& options) {
-    if (options.simulation) {
-        return {"simulated " + std::string(options.simulation->technology->commandName)};
-    }
-    if (!options.recording) {
-        return {"live modem"};
-    }
-    if (options.recording == "-") {
-        return {"standard input", true};
-    }
-    return {std::filesystem::path(*options.recording).filename().string()};
 }
 
 /// As `browseInPrint`. The terminal is restored by the time anything else is told.

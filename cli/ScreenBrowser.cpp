@@ -7,6 +7,7 @@
 
 #include <chrono>
 #include <csignal>
+#include <filesystem>
 #include <utility>
 
 namespace pallax {
@@ -14,6 +15,11 @@ namespace pallax {
 namespace {
 
 constexpr std::chrono::milliseconds kTurnInterval{150};
+
+/// Without the folder of a recording, for which a title has no room.
+std::string titleOf(const BrowsedSource& source) {
+    return std::filesystem::path(source.name).filename().string();
+}
 
 } // namespace
 
@@ -27,14 +33,14 @@ bool ScreenBrowser::Files::writePropertyList(const std::string& path, const Prop
 }
 
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
-                             ChildService* child, Source source, const Settings& settings,
+                             ChildService* child, BrowsedSource source, const Settings& settings,
                              terminal::CursesTerminal& terminal, StandardOutput& notices)
     : _source(std::move(source)), _terminal(terminal),
       _link(std::move(directory), onFatalRecord, child, notices),
       _keys(_link.queue(), terminal.inputDescriptor()),
       _frontEnd(frontEndSurroundings(), terminal.marks()), _files(_frontEnd),
       _preferences(FilePreferences::userFolder()), _app(applicationSurroundings(settings)) {
-    _frontEnd.setOrigin({"", _source.name});
+    _frontEnd.setOrigin({"", titleOf(_source)});
 }
 
 ScreenBrowser::~ScreenBrowser() {
@@ -56,7 +62,7 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
 
 void ScreenBrowser::startAfresh() {
     if (_source.isReadOnce) {
-        return _frontEnd.setMessage("Standard input can be played only once");
+        return _frontEnd.setMessage("A stream can be played only once");
     }
     _frontEnd.setNote(""); // of what was played until now
     _app.startAfresh();
@@ -64,7 +70,7 @@ void ScreenBrowser::startAfresh() {
 
 void ScreenBrowser::linkChanged(const std::string& technology,
                                 const std::optional<Time>& valuesFrom) {
-    _frontEnd.setOrigin({technology, _source.name});
+    _frontEnd.setOrigin({technology, titleOf(_source)});
     const DateFormatter time("HH:mm:ss", _link.clock());
     _frontEnd.setOldValues(valuesFrom ? time.stringFromDate(*valuesFrom) : "");
 }

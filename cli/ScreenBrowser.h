@@ -15,20 +15,20 @@ namespace pallax {
 
 struct Settings;
 
+/// Where the packets come from.
+struct BrowsedSource {
+    std::string name; ///< a recording's path, or words
+    bool isReadOnce = false;
+};
+
 /// The application on the terminal that the process runs in.
 class ScreenBrowser {
 public:
-    /// Where the packets come from.
-    struct Source {
-        std::string name; ///< as the title shows it
-        bool isReadOnce = false;
-    };
-
     /// The terminal outlives the browser, so that an error is told on a restored one. So do the
     /// notices, which are to be printed there.
     ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                  Source source, const Settings& settings, terminal::CursesTerminal& terminal,
-                  StandardOutput& notices);
+                  BrowsedSource source, const Settings& settings,
+                  terminal::CursesTerminal& terminal, StandardOutput& notices);
     /// Whatever ended it: the application terminates as it is to at every exit.
     ~ScreenBrowser();
     ScreenBrowser(const ScreenBrowser&) = delete;
@@ -62,7 +62,7 @@ private:
     void adoptSize();
     void look();
 
-    Source _source;
+    BrowsedSource _source;
     bool _childLost = false;
     const PallaxModel* _model = nullptr; // the application's
     bool _isDisplayPosted = false;

@@ -118,7 +118,7 @@ TEST_F(EndToEndOrigin, RPlaysARecordingAgainButStandardInputOnlyOnce) {
     ASSERT_TRUE(piped.shows("End of the recording"));
     EXPECT_TRUE(piped.shows("Zorell_GSM · standard input"));
     piped.type("R");
-    EXPECT_TRUE(piped.shows("Standard input can be played only once"));
+    EXPECT_TRUE(piped.shows("A stream can be played only once"));
     piped.type("q");
     EXPECT_EQ(piped.wait(), 0);
 }
