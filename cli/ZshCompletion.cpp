@@ -1,4 +1,5 @@
 #include "cli/Completion.h"
+#include "platform/Format.h"
 
 namespace pallax {
 
@@ -20,18 +21,22 @@ std::string escaped(const std::string& text, std::string_view special) {
     return result;
 }
 
+std::string actionOf(const OptionDescription& option) {
+    const auto choices = option.choices();
+    if (choices.empty()) {
+        return option.takesFile() ? "_files" : " ";
+    }
+    std::string names;
+    for (const std::string& choice : choices) {
+        names.append(names.empty() ? "" : " ").append(choice);
+    }
+    return formatText("(%@)", {names});
+}
+
 /// ":MESSAGE:ACTION", as _arguments takes it.
 std::string valueOf(const OptionDescription& option) {
     const std::string& message = option.value.empty() ? option.names.front() : option.value;
-    std::string action = option.takesFile() ? "_files" : " ";
-    if (const auto choices = option.choices(); !choices.empty()) {
-        action = "(";
-        for (const std::string& choice : choices) {
-            action.append(action.size() > 1 ? " " : "").append(choice);
-        }
-        action.append(")");
-    }
-    return ":" + escaped(message, ":\\") + ":" + action;
+    return formatText(":%@:%@", {escaped(message, ":\\"), actionOf(option)});
 }
 
 std::string line(const std::string& entry) {
@@ -61,10 +66,11 @@ std::string linesOf(const CommandDescription& command) {
 std::string functionOf(const CommandDescription& command) {
     std::string arguments;
     for (const OptionDescription& argument : command.arguments) {
-        arguments.append(line((argument.repeats ? "*" : "") + valueOf(argument)));
+        arguments.append(
+            line(formatText("%@%@", {argument.repeats ? "*" : "", valueOf(argument)})));
     }
-    return "_pallax_" + command.name + "() {\n    _arguments -s" + linesOf(command) + arguments +
-           "\n}\n\n";
+    return formatText("_pallax_%@() {\n    _arguments -s%@%@\n}\n\n",
+                      {command.name, linesOf(command), arguments});
 }
 
 } // namespace

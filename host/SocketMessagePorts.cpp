@@ -21,9 +21,9 @@ void moveAside(const std::string& path, const std::string& folder) {
     if (::rename(path.c_str(), aside.c_str()) != 0) {
         return;
     }
-    if (listenerAt(aside) == Listener::Living) {
-        (void)::link(aside.c_str(), path.c_str());
-    }
+    // Where the name has been taken meanwhile, it stays with whoever took it.
+    [[maybe_unused]] const bool isBack =
+        listenerAt(aside) == Listener::Living && ::link(aside.c_str(), path.c_str()) == 0;
     (void)::unlink(aside.c_str());
 }
 
