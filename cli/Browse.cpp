@@ -70,6 +70,16 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     return isWhole;
 }
 
+/// While the screen is drawn but the main queue does not hear signals, before it and behind it,
+/// they end the program with the terminal restored.
+class GuardedTerminal {
+public:
+    GuardedTerminal() { terminal::TerminalRestorer::guardEndings(); }
+    ~GuardedTerminal() { terminal::TerminalRestorer::guardEndings(); }
+    GuardedTerminal(const GuardedTerminal&) = delete;
+    GuardedTerminal& operator=(const GuardedTerminal&) = delete;
+};
+
 /// As `browseInPrint`. The terminal is restored by the time anything else is told.
 bool browseOnScreen(const Request& request, SocketDirectory directory, ChildService* child) {
     KeptNotices notices(writeToDescriptor(STDOUT_FILENO, "Standard output"));
@@ -77,6 +87,7 @@ bool browseOnScreen(const Request& request, SocketDirectory directory, ChildServ
     if (!terminal) {
         throw std::runtime_error(terminal.error().sentence);
     }
+    const GuardedTerminal guard;
     ScreenBrowser browser(std::move(directory), request.onFatalRecord, child,
                           sourceOf(request.options), request.settings, **terminal, notices);
     return browser.run();

@@ -22,8 +22,8 @@ constexpr const char* kFooter = R"(Examples:
   pallax record drive.pcapng           write what the live modem sends to a file
   pallax service --play drive.pcap     let viewers connect to a played recording
 
-Each command has a help of its own: pallax decode --help
-A recording named like a command is given with its folder: pallax ./decode
+Each command has a help of its own (pallax decode --help). A recording named
+like a command is given with its folder (pallax ./decode).
 
 Exit status:
   0   success, also when nobody reads the output any more

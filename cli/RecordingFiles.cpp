@@ -126,7 +126,8 @@ std::optional<HostError> RecordingFiles::nextFile() {
                                         {_options.path, kMostParts})};
         }
         path = nextPath();
-    } while (_options.existing == PcapNgWriter::Existing::Keep && fs::exists(path, unknown));
+    } while (fs::exists(path, unknown) && (_options.existing == PcapNgWriter::Existing::Keep ||
+                                           !fs::is_regular_file(path, unknown)));
     auto file = PcapNgWriter::create(path, _options.existing);
     if (!file) {
         return file.error();

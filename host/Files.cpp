@@ -68,9 +68,16 @@ bool writePrivateFile(const std::string& path, std::string_view content) {
     const Descriptor file(::open(
         path.c_str(), O_WRONLY | O_CREAT | O_NOFOLLOW | O_CLOEXEC | kWaitForNobody, kUsersOwn));
     struct stat status {};
-    return file && ::fstat(file.number(), &status) == 0 && S_ISREG(status.st_mode) &&
-           ::fchmod(file.number(), kUsersOwn) == 0 && ::ftruncate(file.number(), 0) == 0 &&
-           writeAll(file, content);
+    if (!file || ::fstat(file.number(), &status) != 0 || !S_ISREG(status.st_mode) ||
+        status.st_nlink != 1 || ::fchmod(file.number(), kUsersOwn) != 0 ||
+        ::ftruncate(file.number(), 0) != 0) {
+        return false;
+    }
+    const bool isWritten = writeAll(file, content);
+    if (!isWritten) {
+        (void)::unlink(path.c_str()); // a part of it would be taken for the whole
+    }
+    return isWritten;
 }
 
 bool replaceFile(const std::string& path, std::string_view content) {

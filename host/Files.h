@@ -22,7 +22,8 @@ Result<ByteBuffer, ReadFailure> readRegularFile(const std::string& path, std::si
 std::optional<ByteBuffer> readFile(const std::string& path, std::size_t largest);
 
 /// Writes straight to the path, a file that only its user may read; false when that failed. What
-/// stands there is replaced if it is a file; a symbolic link, a pipe or a device is refused.
+/// stands there is replaced if it is a file; a symbolic link, a file of several names, a pipe or a
+/// device is refused. A file that cannot be written whole is removed.
 bool writePrivateFile(const std::string& path, std::string_view content);
 
 /// Replaces the file in one step: whoever reads it sees the old content or the new one, also

@@ -62,8 +62,13 @@ static void endIsAsked(int signal) {
     errno = error;
 }
 
-static void interrupt(int /*signal*/) {
+static void interrupt(int signal) {
     const int error = errno;
+    if (state.signal == 0) { // somebody else's: it does what it did before
+        (void)::sigaction(SIGALRM, &state.alarmBefore, nullptr);
+        (void)std::raise(signal); // takes effect behind this handler
+        return;
+    }
     state.ticks = state.ticks + 1;
     if (state.terminal.release != nullptr) {
         state.terminal.release();
@@ -92,6 +97,10 @@ Interruption::Interruption(Terminal terminal, Patience patience) {
     action.sa_handler = interrupt; // without SA_RESTART: interrupting is what it is for
     (void)::sigfillset(&action.sa_mask);
     (void)::sigaction(SIGALRM, &action, &state.alarmBefore);
+    sigset_t alarm;
+    (void)::sigemptyset(&alarm);
+    (void)::sigaddset(&alarm, SIGALRM);
+    (void)::sigprocmask(SIG_UNBLOCK, &alarm, nullptr); // a parent may have blocked it
     state.isActive = ::timer_create(CLOCK_MONOTONIC, nullptr, &state.timer) == 0;
 }
 

@@ -130,7 +130,7 @@ std::optional<HostError> PcapNgWriter::open(bool isNew) {
     _device = status.st_dev;
     _inode = status.st_ino;
     if (_isFile && ::flock(_number, LOCK_EX | LOCK_NB) != 0 && errno == EWOULDBLOCK) {
-        return HostError{formatText("%@ is being written by another program.", {_name})};
+        return HostError{formatText("%@ is being read or written by another program.", {_name})};
     }
     _isNew = isNew;
     return isNew || !_isFile ? beginSection() : std::nullopt;

@@ -8,6 +8,13 @@
 
 namespace pallax {
 
+namespace {
+
+/// The last tick follows the latest packet that there can be.
+constexpr Time kLatestTick = kLatestTime + std::chrono::minutes(1);
+
+} // namespace
+
 struct SourceClock::TimerState {
     std::chrono::nanoseconds interval;
     std::function<void()> action;
@@ -93,8 +100,8 @@ void SourceClock::sourceBegan(bool isLive) {
 }
 
 bool SourceClock::advance(Time sourceTime) {
-    const Time time = std::clamp(sourceTime, kEarliestTime, kLatestTime);
-    _stamp = time;
+    const Time time = std::clamp(sourceTime, kEarliestTime, kLatestTick);
+    _stamp = std::min(time, kLatestTime);
     _heard = _steadyNow();
     _timers.remove_if([](const auto& timer) { return timer.expired(); });
     if (_isLive) {

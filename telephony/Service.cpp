@@ -2,6 +2,7 @@
 
 #include "host/AsioMainQueue.h"
 #include "host/Complaint.h"
+#include "host/Descriptor.h"
 #include "host/Interruption.h"
 #include "host/SocketMessagePorts.h"
 #include "platform/Format.h"
@@ -19,7 +20,9 @@
 #include <cmath>
 #include <csignal>
 #include <cstdio>
+#include <fcntl.h>
 #include <memory>
+#include <sys/file.h>
 
 namespace pallax {
 
@@ -32,7 +35,15 @@ struct Program {
     std::string technology;
     PacketSourceFactory makeSource;
     std::shared_ptr<Relay> relay; ///< null for what is no live stream
+    Descriptor reading{};         ///< keeps recorders from replacing the recording that is played
 };
+
+/// A recording that is still being written is played all the same.
+Descriptor lockForReading(const std::string& path) {
+    Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+    (void)::flock(file.number(), LOCK_SH | LOCK_NB);
+    return file;
+}
 
 Result<std::unique_ptr<PacketSource>, HostError> takeOnce(std::unique_ptr<PacketSource>& stream,
                                                           const std::string& name) {
@@ -65,13 +76,14 @@ Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueu
     program.technology = (*recording)->technology()->identifier;
     if (!(*recording)->isStream()) {
         program.makeSource = [path = options.recording] { return RecordingSource::open(path); };
+        program.reading = lockForReading(options.recording);
         return program;
     }
     const auto stream = std::make_shared<std::unique_ptr<PacketSource>>(
         std::make_unique<StreamSource>(queue, std::move(recording).value()));
     if (!options.relay) {
-        const bool isUnnamed = options.recording == "-" && options.inputName.empty();
-        const std::string name = isUnnamed ? "Standard input" : options.recording;
+        const std::string path = options.recording == "-" ? "Standard input" : options.recording;
+        const std::string name = options.inputName.empty() ? path : options.inputName;
         program.makeSource = [stream, name] { return takeOnce(*stream, name); };
         return program;
     }

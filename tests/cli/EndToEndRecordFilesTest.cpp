@@ -89,11 +89,24 @@ TEST_F(EndToEndRecordFiles, ThatAreBeingWrittenTakeNoSecondRecorder) {
     EXPECT_TRUE(grows(file));
     const Run second = run({"record", "--overwrite", file});
     EXPECT_EQ(second.status, 1);
-    EXPECT_EQ(second.err, "pallax: " + file + " is being written by another program.\n");
+    EXPECT_EQ(second.err, "pallax: " + file + " is being read or written by another program.\n");
     EXPECT_TRUE(grows(file)) << "the first is none the worse";
     recorder.signal(SIGINT);
     EXPECT_EQ(recorder.wait(), 0);
     EXPECT_EQ(recorder.err(), "");
+}
+
+TEST_F(EndToEndRecordFiles, ThatAServicePlaysAreNotReplaced) {
+    const std::string played = gsmAttach();
+    const std::string before = doubles::contentOf(played);
+    PallaxProcess service(world, {"service", "--play", played, "--speed", "max"});
+    ASSERT_TRUE(eventually([this] { return !world.sockets().empty(); }));
+    const Run refused = run({"record", "--overwrite", played});
+    EXPECT_EQ(refused.status, 1);
+    EXPECT_EQ(refused.err, "pallax: " + played + " is being read or written by another program.\n");
+    EXPECT_EQ(doubles::contentOf(played), before);
+    service.signal(SIGTERM);
+    EXPECT_EQ(service.wait(), 0);
 }
 
 TEST_F(EndToEndRecordFiles, ThatAreRemovedMovedOrReplacedEndTheRecorder) {

@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <sys/stat.h>
 
 namespace pallax {
 namespace {
@@ -137,6 +138,17 @@ TEST_F(RecordingFilesTest, ANumberThatIsTakenIsRefusedAtFirstAndPassedOverLater)
     ASSERT_EQ(add(**files, seconds(0)), std::nullopt);
     ASSERT_EQ(add(**files, seconds(1)), std::nullopt);
     EXPECT_EQ(packetsIn("a-0002.pcapng"), 1);
+}
+
+TEST_F(RecordingFilesTest, WhatIsNoFileIsPassedOverAlsoWhereFilesAreReplaced) {
+    auto options = optionsFor("a.pcapng");
+    options.rotateSize = 1;
+    options.existing = PcapNgWriter::Existing::Overwrite;
+    ASSERT_EQ(::mkfifo(folder.file("a-0002.pcapng").c_str(), 0600), 0);
+    const auto files = RecordingFiles::open(options);
+    ASSERT_EQ(add(**files, seconds(0)), std::nullopt);
+    ASSERT_EQ(add(**files, seconds(1)), std::nullopt) << "nobody waits for a reader";
+    EXPECT_EQ(packetsIn("a-0003.pcapng"), 1);
 }
 
 TEST_F(RecordingFilesTest, WhatNoReaderWouldTakeIsLeftOutAndCounted) {

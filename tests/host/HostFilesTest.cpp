@@ -12,11 +12,13 @@
 #include <gtest/gtest.h>
 
 #include <array>
+#include <csignal>
 #include <cstdlib>
 #include <ctime>
 #include <fcntl.h>
 #include <filesystem>
 #include <regex>
+#include <sys/resource.h>
 #include <sys/stat.h>
 
 namespace pallax {
@@ -64,6 +66,20 @@ TEST_F(HostFilesTest, APropertyListIsItsUsersAloneAlsoWhereItReplacesAFile) {
     EXPECT_EQ(parsed("a.pallax"), PropertyList("second"));
 }
 
+TEST_F(HostFilesTest, WhatCannotBeWrittenWholeIsRemoved) {
+    HostFileSystem files;
+    rlimit before{};
+    ::getrlimit(RLIMIT_FSIZE, &before);
+    const rlimit small{10, before.rlim_max};
+    const auto handler = std::signal(SIGXFSZ, SIG_IGN);
+    ::setrlimit(RLIMIT_FSIZE, &small);
+    const bool isWritten = files.writePropertyList(_folder.file("a.pallax"), "snapshot");
+    ::setrlimit(RLIMIT_FSIZE, &before);
+    (void)std::signal(SIGXFSZ, handler);
+    EXPECT_FALSE(isWritten);
+    EXPECT_FALSE(files.exists(_folder.file("a.pallax")));
+}
+
 TEST_F(HostFilesTest, ALinkAPipeAndADeviceAreNotWrittenTo) {
     HostFileSystem files;
     const std::string target = _folder.write("target", "before");
@@ -74,6 +90,10 @@ TEST_F(HostFilesTest, ALinkAPipeAndADeviceAreNotWrittenTo) {
     std::filesystem::create_symlink(_folder.file("absent"), _folder.file("dangling"));
     EXPECT_FALSE(files.writePropertyList(_folder.file("dangling"), "snapshot"));
     EXPECT_FALSE(files.exists(_folder.file("absent")));
+
+    std::filesystem::create_hard_link(target, _folder.file("second name"));
+    EXPECT_FALSE(files.writePropertyList(_folder.file("second name"), "snapshot"));
+    EXPECT_EQ(doubles::contentOf(target), "before");
 
     const std::string pipe = _folder.file("pipe");
     ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);

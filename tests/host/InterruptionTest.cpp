@@ -116,6 +116,26 @@ TEST_F(InterruptionTest, BeforeItIsDueNothingIsInterrupted) {
     queue.run();
 }
 
+TEST_F(InterruptionTest, AnAlarmOfSomebodyElseEndsTheProgramAsWithoutIt) {
+    EXPECT_EQ(signalAfter([] {
+                  const Interruption interruption(kNoTerminal, kLong);
+                  (void)std::raise(SIGALRM);
+              }),
+              SIGALRM);
+}
+
+TEST_F(InterruptionTest, AnAlarmThatTheParentHasBlockedIsHeard) {
+    sigset_t alarm;
+    (void)::sigemptyset(&alarm);
+    (void)::sigaddset(&alarm, SIGALRM);
+    (void)::sigprocmask(SIG_BLOCK, &alarm, nullptr);
+    const Interruption interruption(kNoTerminal, kShort);
+    AsioMainQueue queue;
+    queue.onSignal({SIGTERM}, [](int /*signal*/) {});
+    (void)std::raise(SIGTERM);
+    EXPECT_TRUE(writeIsGivenUp());
+}
+
 TEST_F(InterruptionTest, OtherSignalsAskForNoEnd) {
     const Interruption interruption(kNoTerminal, kShort);
     AsioMainQueue queue;

@@ -171,7 +171,7 @@ TEST_F(PcapNgWriterTest, AFileOfAnotherInItsPlaceIsNotRemoved) {
 }
 
 TEST_F(PcapNgWriterTest, AFileThatIsBeingWrittenTakesNoSecondWriter) {
-    const std::string sentence = path + " is being written by another program.";
+    const std::string sentence = path + " is being read or written by another program.";
     {
         const auto first = create();
         EXPECT_EQ(PcapNgWriter::create(path, Existing::Overwrite).error().sentence, sentence);

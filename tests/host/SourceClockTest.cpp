@@ -309,8 +309,17 @@ TEST_F(SourceClockTest, TimesAtTheEdgeOfTheRangeOverflowNothing) {
         while (_clock.advance(edge(count))) {
         }
     }
-    EXPECT_EQ(_clock.now(), kLatestTime);
+    EXPECT_EQ(_clock.now(), kLatestTime + 1min);
     EXPECT_EQ(_clock.stamp(), kLatestTime);
+    EXPECT_EQ(_ticks.size(), 1U);
+}
+
+TEST_F(SourceClockTest, TheLatestPacketThatThereCanBeIsFollowedByATick) {
+    const auto timer = tick(2s);
+    for (const Time time : {kLatestTime, kLatestTime, kLatestTime + 2s}) {
+        while (_clock.advance(time)) {
+        }
+    }
     EXPECT_EQ(_ticks.size(), 1U);
 }
 

@@ -12,6 +12,7 @@ namespace pallax::terminal {
 namespace {
 
 constexpr std::array kDeadly{SIGSEGV, SIGBUS, SIGFPE, SIGILL, SIGABRT, SIGQUIT, SIGSYS, SIGTRAP};
+constexpr std::array kEnding{SIGINT, SIGTERM, SIGHUP, SIGQUIT};
 /// The handler runs on a stack of its own, for the other may be what has run out.
 constexpr std::size_t kStackSize = std::size_t{32} << 10U;
 constexpr std::size_t kMaximumSequence = 256;
@@ -38,6 +39,23 @@ static void restoreAndDie(int signal) {
 }
 
 namespace {
+
+template <std::size_t kCount>
+void restoreAt(const std::array<int, kCount>& signals) {
+    struct sigaction action {};
+    action.sa_handler = restoreAndDie;
+    action.sa_flags = static_cast<int>(SA_RESETHAND | SA_ONSTACK);
+    for (const int signal : signals) {
+        (void)::sigaction(signal, &action, nullptr);
+    }
+}
+
+template <std::size_t kCount>
+void giveBack(const std::array<int, kCount>& signals) {
+    for (const int signal : signals) {
+        (void)std::signal(signal, SIG_DFL);
+    }
+}
 
 /// As Ctrl-Q. What undoes a stop of the program's own does not undo the user's, unless that comes
 /// on top.
@@ -71,23 +89,21 @@ TerminalRestorer::TerminalRestorer(int descriptor) {
     stack.ss_sp = restoration.stack.data();
     stack.ss_size = restoration.stack.size();
     (void)::sigaltstack(&stack, nullptr);
-    struct sigaction action {};
-    action.sa_handler = restoreAndDie;
-    action.sa_flags = static_cast<int>(SA_RESETHAND | SA_ONSTACK);
-    for (const int signal : kDeadly) {
-        (void)::sigaction(signal, &action, nullptr);
-    }
+    restoreAt(kDeadly);
 }
 
 TerminalRestorer::~TerminalRestorer() {
-    for (const int signal : kDeadly) {
-        (void)std::signal(signal, SIG_DFL);
-    }
+    giveBack(kDeadly);
+    giveBack(kEnding);
     stack_t none{};
     none.ss_flags = SS_DISABLE;
     (void)::sigaltstack(&none, nullptr);
     restoration.hasModes = false;
     restoration.size = 0;
+}
+
+void TerminalRestorer::guardEndings() {
+    restoreAt(kEnding);
 }
 
 void TerminalRestorer::setSequence(std::string_view sequence) {

@@ -17,6 +17,10 @@ public:
     /// What is written to the terminal; nothing at first.
     void setSequence(std::string_view sequence);
 
+    /// From here on SIGINT, SIGTERM, SIGHUP and SIGQUIT restore the terminal and end the process
+    /// too, until others handle them.
+    static void guardEndings();
+
     /// Both are safe in a signal handler, and do nothing while there is no restorer. Lets output go
     /// on that Ctrl-S, or a terminal that takes nothing, holds back; what waits there is dropped.
     static void release();

@@ -100,6 +100,20 @@ TEST_F(TerminalRestorerTest, RestoresTheTerminalAtEveryDeadlySignalAndDiesOfIt) 
     }
 }
 
+TEST_F(TerminalRestorerTest, RestoresTheTerminalAtASignalThatAsksForTheEndWhereNobodyHearsIt) {
+    for (const int signal : {SIGINT, SIGTERM, SIGHUP, SIGQUIT}) {
+        EXPECT_EQ(signalAfter([&] {
+                      const TerminalRestorer restorer(terminal);
+                      switchEchoOff(terminal);
+                      (void)std::signal(signal, SIG_DFL); // as a queue does that ends
+                      TerminalRestorer::guardEndings();
+                      (void)std::raise(signal);
+                  }),
+                  signal);
+        EXPECT_TRUE(echoes(terminal)) << signal;
+    }
+}
+
 TEST_F(TerminalRestorerTest, RestoresTheTerminalAtAnAbort) {
     EXPECT_EQ(signalAfter([this] {
                   TerminalRestorer restorer(terminal);
