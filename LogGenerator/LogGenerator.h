@@ -55,8 +55,7 @@ public:
     /// Brings the live display up to the latest packet, for whoever looks at it, or at the history,
     /// without generating it: a generator may read a packet as late as that.
     virtual void catchUp() {}
-    /// Whether a display that the state already holds keeps its values, whatever this generator,
-    /// new to the state, receives.
+    /// True when this generator cannot update the display that an earlier one left in the state.
     virtual bool keepsDisplay(const Dictionary& state) const;
     /// The property-list dictionary that starts the modem's stream.
     virtual PropertyList getStartCommand() const;

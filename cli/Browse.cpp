@@ -70,8 +70,8 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     return isWhole;
 }
 
-/// While the screen is drawn but the main queue does not hear signals, before it and behind it,
-/// they end the program with the terminal restored.
+/// Restores the terminal when a signal ends the program while the main queue does not handle
+/// signals: before the queue starts and after it has gone.
 class GuardedTerminal {
 public:
     GuardedTerminal() { terminal::TerminalRestorer::guardEndings(); }

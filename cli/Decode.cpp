@@ -32,7 +32,7 @@ std::optional<struct stat> fileStatus(const std::string& recording) {
     return result == 0 ? std::optional(status) : std::nullopt;
 }
 
-/// The sentence's name of the recording that is the same file, by whatever path; else nothing.
+/// The recording that is the same file, as the user named it.
 std::optional<std::string> recordingIn(const struct stat& file, const DecodeOptions& options) {
     for (const std::string& recording : options.recordings) {
         const auto status = fileStatus(recording);

@@ -17,8 +17,8 @@
 namespace pallax {
 
 /// Records what a viewer would be shown: a model opens the log channel and keeps it open, and the
-/// packets go into files instead of into a display, each with its source's
-/// stamp, whatever that is.
+/// packets go into files instead of into a display, each with the stamp
+/// that the source sent.
 class Recorder final : private LinkListener, private ModelObserver {
 public:
     /// Gets, about once a second, how far it has come.

@@ -36,8 +36,8 @@ public:
     /// As many names as sort in the order in which they are written.
     static constexpr unsigned kMostParts = 9999;
 
-    /// Opens the first file; fails where it exists already and is to be kept, and where a limit is
-    /// asked of what is no file. `notice` is told where a technology begins another file.
+    /// Opens the first file; fails where it exists already and is to be kept, and where files
+    /// are to rotate but the path is no file. `notice` hears when a new technology begins a file.
     static Result<std::unique_ptr<RecordingFiles>, HostError> open(const Options& options,
                                                                    Notice notice = {});
 

@@ -9,16 +9,16 @@
 
 namespace pallax {
 
-/// A display template cannot be loaded; the text is the sentence. No record is at fault: whoever
-/// drops a packet whose record throws lets this one pass.
+/// A display template cannot be loaded; the text is one sentence for the user. It ends the program
+/// even where packets whose records throw are dropped.
 class TemplateFailure : public std::runtime_error {
 public:
     using std::runtime_error::runtime_error;
 };
 
 /// The display templates as files of one folder. A generator that finds no template shows nothing
-/// and goes on, so the program would never notice: this throws TemplateFailure when a template
-/// that is asked for cannot be had. Templates that nobody asks for may be missing.
+/// and goes on, so the program would never notice: this throws TemplateFailure when a requested
+/// template cannot be loaded. Other templates may be missing.
 class RequiredTemplates final : public Resources {
 public:
     explicit RequiredTemplates(std::string folder) : _files(std::move(folder)) {}

@@ -24,8 +24,8 @@ struct BrowsedSource {
 /// The application on the terminal that the process runs in.
 class ScreenBrowser {
 public:
-    /// The terminal outlives the browser, so that an error is told on a restored one. So do the
-    /// notices, which are to be printed there.
+    /// Terminal and notices outlive the browser: errors and notices are printed once the terminal
+    /// is restored.
     ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
                   BrowsedSource source, const Settings& settings,
                   terminal::CursesTerminal& terminal, StandardOutput& notices);

@@ -6,7 +6,7 @@
 #include <string>
 #include <string_view>
 
-/// What the user is told of an odd stamp.
+/// The sentence that reports an odd stamp.
 namespace pallax {
 
 /// "drive.pcap: no packets for 3600.0 s before packet 18."
