@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/Bytes.h"
+#include "text/Bytes.h"
 
 #include <cstddef>
 #include <cstdint>

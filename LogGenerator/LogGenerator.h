@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
+#include "text/Bytes.h"
 
 #include <memory>
 #include <span>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/LogGenerator.h"
-#include "platform/Bytes.h"
+#include "text/Bytes.h"
 
 #include <memory>
 #include <optional>

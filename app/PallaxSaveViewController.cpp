@@ -2,10 +2,10 @@
 
 #include "platform/Clock.h"
 #include "platform/FileSystem.h"
-#include "platform/Format.h"
 #include "platform/MainQueue.h"
 #include "platform/SystemLog.h"
-#include "platform/XmlWritable.h"
+#include "plist/XmlWritable.h"
+#include "text/Format.h"
 
 #include <utility>
 

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "platform/Date.h"
-#include "platform/PropertyList.h"
 #include "platform/ui/ModalScreen.h"
+#include "plist/PropertyList.h"
+#include "text/Date.h"
 
 #include <cstddef>
 #include <functional>

@@ -10,8 +10,8 @@
 #include "LogGenerator/LTE/ReselectionCandidatesMisc.h"
 #include "LogGenerator/LTE/ServingCellMeasurement.h"
 #include "bench/MeasureRecord.h"
-#include "platform/PropertyListCodec.h"
 #include "platform/TelephonyConstants.h"
+#include "plist/PropertyListCodec.h"
 
 namespace pallax {
 namespace {

@@ -2,7 +2,7 @@
 // which the generator does when somebody looks.
 
 #include "LogGenerator/GSM/GSMLogGenerator.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/doubles/GeneratorFixture.h"
 #include "tests/doubles/TextPropertyList.h"
 

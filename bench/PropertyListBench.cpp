@@ -1,7 +1,7 @@
 // Reading and writing a cell-monitor array of 200 cells, the largest list that a modem's service
 // sends every few seconds.
 
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 
 #include <benchmark/benchmark.h>
 

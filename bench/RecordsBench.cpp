@@ -23,8 +23,8 @@
 #include "LogGenerator/ZOR_GSM/UMTSSet.h"
 #include "LogGenerator/ZOR_GSM/VirtualActiveSet.h"
 #include "bench/MeasureRecord.h"
-#include "platform/PropertyListCodec.h"
 #include "platform/TelephonyConstants.h"
+#include "plist/PropertyListCodec.h"
 
 #include <string>
 #include <string_view>

@@ -2,8 +2,8 @@
 // written as a recording.
 
 #include "host/Recording.h"
-#include "telephony/simulator/SimulatedRecording.h"
-#include "telephony/simulator/Simulation.h"
+#include "simulator/SimulatedRecording.h"
+#include "simulator/Simulation.h"
 
 #include <benchmark/benchmark.h>
 

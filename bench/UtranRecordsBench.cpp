@@ -7,8 +7,8 @@
 #include "LogGenerator/UTRAN/UTRANNeighbhorMeasurements.h"
 #include "LogGenerator/UTRAN/UTRANServingCellInfo.h"
 #include "bench/MeasureRecord.h"
-#include "platform/PropertyListCodec.h"
 #include "platform/TelephonyConstants.h"
+#include "plist/PropertyListCodec.h"
 
 namespace pallax {
 namespace {

@@ -1,8 +1,8 @@
 #include "cli/BrowseLink.h"
 
 #include "LogGenerator/Technologies/Technologies.h"
-#include "platform/Format.h"
 #include "telephony/ChildService.h"
+#include "text/Format.h"
 
 #include <sys/wait.h>
 #include <unistd.h>

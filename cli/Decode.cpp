@@ -10,7 +10,7 @@
 #include "host/LogSinks.h"
 #include "host/MonotonicClock.h"
 #include "host/RecordingFile.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <cstdio>

@@ -1,8 +1,8 @@
 #include "cli/DisplayJson.h"
 
-#include "platform/Base64.h"
-#include "platform/Printable.h"
-#include "platform/Utf8.h"
+#include "text/Base64.h"
+#include "text/Printable.h"
+#include "text/Utf8.h"
 
 #include <algorithm>
 #include <array>

@@ -3,7 +3,7 @@
 #include "app/tree/PallaxModelNode.h"
 #include "app/tree/ShownEntries.h"
 #include "cli/DisplayJson.h"
-#include "platform/Printable.h"
+#include "text/Printable.h"
 
 #include <cmath>
 

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "cli/Output.h"
-#include "platform/Date.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
+#include "text/Date.h"
 
 #include <cstdint>
 #include <map>

@@ -1,7 +1,7 @@
 #include "cli/LinkPorts.h"
 
-#include "platform/Format.h"
 #include "telephony/ControlMessages.h"
+#include "text/Format.h"
 
 #include <cerrno>
 #include <cstring>

@@ -1,7 +1,7 @@
 #include "cli/ManualPage.h"
 
 #include "cli/HelpText.h"
-#include "platform/Roff.h"
+#include "text/Roff.h"
 #include "ui/terminal/KeyHelp.h"
 
 #include <utility>

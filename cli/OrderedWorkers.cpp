@@ -2,7 +2,7 @@
 
 #include "cli/Output.h"
 #include "host/Complaint.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <array>

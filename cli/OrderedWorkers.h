@@ -3,7 +3,7 @@
 #include "cli/ExitStatus.h"
 #include "host/Descriptor.h"
 #include "host/HostError.h"
-#include "platform/Result.h"
+#include "text/Result.h"
 
 #include <cstddef>
 #include <deque>

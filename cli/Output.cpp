@@ -1,8 +1,8 @@
 #include "cli/Output.h"
 
 #include "host/Interruption.h"
-#include "platform/Format.h"
-#include "platform/Printable.h"
+#include "text/Format.h"
+#include "text/Printable.h"
 
 #include <cerrno>
 #include <system_error>

@@ -6,7 +6,7 @@
 #include "cli/WaitNotice.h"
 #include "host/Complaint.h"
 #include "host/FilePreferences.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <chrono>
 #include <csignal>

@@ -1,6 +1,6 @@
 #include "cli/Progress.h"
 
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <algorithm>
 

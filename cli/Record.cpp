@@ -8,7 +8,7 @@
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/LogSinks.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <csignal>

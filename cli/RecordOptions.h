@@ -1,7 +1,7 @@
 #pragma once
 
 #include "cli/RecordingFiles.h"
-#include "platform/Result.h"
+#include "text/Result.h"
 
 #include <chrono>
 #include <cstdint>

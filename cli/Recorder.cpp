@@ -2,9 +2,9 @@
 
 #include "cli/WaitNotice.h"
 #include "host/Recording.h"
-#include "platform/Format.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "telephony/ControlMessages.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <chrono>

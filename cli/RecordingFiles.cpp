@@ -1,7 +1,7 @@
 #include "cli/RecordingFiles.h"
 
 #include "host/Recording.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <filesystem>
 #include <system_error>

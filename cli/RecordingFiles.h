@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/PcapNgWriter.h"
-#include "platform/StampSequence.h"
+#include "timeline/StampSequence.h"
 
 #include <chrono>
 #include <cstdint>

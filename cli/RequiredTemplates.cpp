@@ -1,7 +1,7 @@
 #include "cli/RequiredTemplates.h"
 
 #include "LogGenerator/Technologies/Technologies.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <algorithm>
 

@@ -1,7 +1,7 @@
 #include "cli/Settings.h"
 
 #include "host/Files.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <charconv>

@@ -2,7 +2,7 @@
 
 #include "cli/FatalRecord.h"
 #include "cli/ScopedLog.h"
-#include "platform/Result.h"
+#include "text/Result.h"
 
 #include <cstddef>
 #include <optional>

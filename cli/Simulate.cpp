@@ -3,7 +3,7 @@
 #include "cli/TerminalLine.h"
 #include "host/Complaint.h"
 #include "host/MonotonicClock.h"
-#include "telephony/simulator/SimulatedRecording.h"
+#include "simulator/SimulatedRecording.h"
 
 #include <chrono>
 #include <unistd.h>

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "simulator/Simulation.h"
 #include "telephony/PacketPlayer.h"
-#include "telephony/simulator/Simulation.h"
 
 #include <optional>
 #include <string>

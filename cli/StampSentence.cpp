@@ -1,6 +1,6 @@
 #include "cli/StampSentence.h"
 
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <chrono>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/StampSequence.h"
+#include "timeline/StampSequence.h"
 
 #include <cstdint>
 #include <string>

@@ -1,6 +1,6 @@
 #include "cli/TerminalLine.h"
 
-#include "platform/Printable.h"
+#include "text/Printable.h"
 
 #include <algorithm>
 #include <cstdio>

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "monitor/PallaxModel.h"
-#include "platform/StampSequence.h"
-#include "platform/TimeGrid.h"
+#include "timeline/StampSequence.h"
+#include "timeline/TimeGrid.h"
 
 #include <chrono>
 #include <cstdint>

@@ -1,7 +1,7 @@
 #include "cli/TreePrinter.h"
 
 #include "platform/Clock.h"
-#include "platform/Printable.h"
+#include "text/Printable.h"
 
 namespace pallax {
 

@@ -1,6 +1,6 @@
 #include "cli/ZoneText.h"
 
-#include "platform/Format.h"
+#include "text/Format.h"
 
 namespace pallax {
 

@@ -1,5 +1,5 @@
 #include "cli/Completion.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 namespace pallax {
 

@@ -1,5 +1,5 @@
 #include "fuzz/PropertyListCheck.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 
 #include <cstddef>
 #include <cstdint>

@@ -2,8 +2,8 @@
 // and what the quick reader of plain texts takes, the whole reader reads alike.
 
 #include "fuzz/PropertyListCheck.h"
-#include "platform/PlainXmlReader.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PlainXmlReader.h"
+#include "plist/PropertyListCodec.h"
 
 #include <cstddef>
 #include <cstdint>

@@ -1,6 +1,6 @@
 #include "host/Complaint.h"
 
-#include "platform/Printable.h"
+#include "text/Printable.h"
 
 #include <cstdio>
 #include <string>

@@ -1,8 +1,8 @@
 #include "host/DirectoryResources.h"
 
 #include "host/Files.h"
-#include "platform/Format.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <cstdlib>

@@ -2,7 +2,7 @@
 
 #include "host/HostError.h"
 #include "platform/Resources.h"
-#include "platform/Result.h"
+#include "text/Result.h"
 
 namespace pallax {
 

@@ -1,6 +1,6 @@
 #include "host/FileName.h"
 
-#include "platform/Format.h"
+#include "text/Format.h"
 
 namespace pallax {
 

@@ -2,7 +2,7 @@
 
 #include "host/FileName.h"
 #include "host/Files.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 
 #include <cstdlib>
 #include <filesystem>

@@ -1,7 +1,7 @@
 #include "host/Files.h"
 
 #include "host/Descriptor.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <array>

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/Result.h"
+#include "text/Bytes.h"
+#include "text/Result.h"
 
 #include <optional>
 #include <string>

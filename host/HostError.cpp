@@ -1,6 +1,6 @@
 #include "host/HostError.h"
 
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <cerrno>
 #include <cstring>

@@ -1,7 +1,7 @@
 #include "host/HostFileSystem.h"
 
 #include "host/Files.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 
 #include <filesystem>
 

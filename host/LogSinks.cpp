@@ -1,6 +1,6 @@
 #include "host/LogSinks.h"
 
-#include "platform/Printable.h"
+#include "text/Printable.h"
 
 #include <cerrno>
 #include <cstring>

@@ -1,9 +1,9 @@
 #pragma once
 
 #include "host/HostError.h"
-#include "platform/Printable.h"
-#include "platform/Result.h"
 #include "platform/SystemLog.h"
+#include "text/Printable.h"
+#include "text/Result.h"
 
 #include <cstdio>
 #include <memory>

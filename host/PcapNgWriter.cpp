@@ -1,7 +1,7 @@
 #include "host/PcapNgWriter.h"
 
 #include "host/Interruption.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <cerrno>

@@ -2,9 +2,9 @@
 
 #include "host/Descriptor.h"
 #include "host/HostError.h"
-#include "platform/Bytes.h"
-#include "platform/Date.h"
-#include "platform/Result.h"
+#include "text/Bytes.h"
+#include "text/Date.h"
+#include "text/Result.h"
 
 #include <cstdint>
 #include <memory>

@@ -2,7 +2,7 @@
 
 #include "host/Recording.h"
 #include "host/RecordingFile.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <pcap/pcap.h>
 

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/Date.h"
-#include "platform/StampSequence.h"
+#include "text/Bytes.h"
+#include "text/Date.h"
+#include "timeline/StampSequence.h"
 
 #include <array>
 #include <cstddef>

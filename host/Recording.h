@@ -1,8 +1,8 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/Date.h"
-#include "platform/Result.h"
+#include "text/Bytes.h"
+#include "text/Date.h"
+#include "text/Result.h"
 
 #include <cstddef>
 #include <cstdint>

@@ -2,7 +2,7 @@
 
 #include "host/Descriptor.h"
 #include "host/Recording.h"
-#include "platform/Result.h"
+#include "text/Result.h"
 
 #include <chrono>
 #include <string>

@@ -1,6 +1,6 @@
 #include "host/RecordingWriter.h"
 
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <array>
 #include <cerrno>

@@ -1,9 +1,9 @@
 #pragma once
 
 #include "host/HostError.h"
-#include "platform/Bytes.h"
-#include "platform/Date.h"
-#include "platform/Result.h"
+#include "text/Bytes.h"
+#include "text/Date.h"
+#include "text/Result.h"
 
 #include <cstdio>
 #include <future>

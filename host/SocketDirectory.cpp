@@ -2,7 +2,7 @@
 
 #include "host/FileName.h"
 #include "host/UnixSocket.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <cerrno>
 #include <chrono>

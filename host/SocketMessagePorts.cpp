@@ -3,7 +3,7 @@
 #include "host/SocketLocalPort.h"
 #include "host/SocketRemotePort.h"
 #include "host/UnixSocket.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <cerrno>
 #include <cstdio>

@@ -1,6 +1,6 @@
 #include "host/SourceClock.h"
 
-#include "platform/TimeGrid.h"
+#include "timeline/TimeGrid.h"
 
 #include <algorithm>
 #include <utility>

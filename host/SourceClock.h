@@ -3,7 +3,7 @@
 #include "host/SourceTimeListener.h"
 #include "platform/Clock.h"
 #include "platform/RepeatingTimer.h"
-#include "platform/StampSequence.h"
+#include "timeline/StampSequence.h"
 
 #include <chrono>
 #include <cstdint>

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/Date.h"
-#include "platform/StampSequence.h"
+#include "text/Date.h"
+#include "timeline/StampSequence.h"
 
 #include <cstdint>
 

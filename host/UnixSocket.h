@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/Descriptor.h"
-#include "platform/Bytes.h"
+#include "text/Bytes.h"
 
 #include <cstdint>
 #include <optional>

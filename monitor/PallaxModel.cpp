@@ -1,9 +1,9 @@
 #include "monitor/PallaxModel.h"
 
 #include "platform/MainQueue.h"
-#include "platform/PropertyListCodec.h"
 #include "platform/SystemLog.h"
 #include "platform/TelephonyService.h"
+#include "plist/PropertyListCodec.h"
 
 #include <string>
 #include <utility>

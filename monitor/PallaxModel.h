@@ -3,9 +3,9 @@
 #include "LogGenerator/LogGenerator.h"
 #include "app/tree/PallaxModelNode.h"
 #include "platform/MessagePort.h"
-#include "platform/PropertyList.h"
-#include "platform/PropertyListCodec.h"
 #include "platform/RepeatingTimer.h"
+#include "plist/PropertyList.h"
+#include "plist/PropertyListCodec.h"
 
 #include <chrono>
 #include <memory>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/Date.h"
+#include "text/Date.h"
 
 #include <chrono>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <string_view>
 

@@ -1,7 +1,7 @@
 #include "reference/Phrases.h"
 
-#include "platform/Format.h"
 #include "platform/TelephonyConstants.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <array>

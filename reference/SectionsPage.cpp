@@ -1,8 +1,8 @@
 #include "reference/SectionsPage.h"
 
 #include "host/Recording.h"
-#include "platform/Roff.h"
 #include "reference/CodeText.h"
+#include "text/Roff.h"
 
 namespace pallax {
 

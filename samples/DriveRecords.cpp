@@ -1,7 +1,7 @@
 #include "samples/DriveRecords.h"
 
-#include "platform/PropertyListCodec.h"
 #include "platform/TelephonyConstants.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/doubles/RecordBuilder.h"
 
 #include <stdexcept>

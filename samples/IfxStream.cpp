@@ -1,4 +1,4 @@
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "samples/Drive.h"
 #include "tests/doubles/TextPropertyList.h"
 

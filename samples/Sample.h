@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/Date.h"
+#include "text/Bytes.h"
+#include "text/Date.h"
 
 #include <string_view>
 #include <vector>

@@ -1,6 +1,6 @@
 #include "host/Recording.h"
 #include "samples/Sample.h"
-#include "telephony/simulator/Simulation.h"
+#include "simulator/Simulation.h"
 
 #include <chrono>
 

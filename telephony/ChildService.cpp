@@ -2,7 +2,7 @@
 
 #include "host/Recording.h"
 #include "host/SocketDirectory.h"
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <climits>
 

@@ -2,8 +2,8 @@
 
 #include "host/Descriptor.h"
 #include "host/HostError.h"
-#include "platform/Result.h"
 #include "telephony/Service.h"
+#include "text/Result.h"
 
 #include <memory>
 #include <string>

@@ -1,7 +1,7 @@
 #include "telephony/CodeFilter.h"
 
 #include "LogGenerator/LogPacket.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <string_view>
 

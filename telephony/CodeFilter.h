@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/LogCode.h"
-#include "platform/Bytes.h"
+#include "text/Bytes.h"
 
 #include <cstdint>
 #include <optional>

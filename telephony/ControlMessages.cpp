@@ -1,6 +1,6 @@
 #include "telephony/ControlMessages.h"
 
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 
 namespace pallax {
 

@@ -1,8 +1,8 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/PropertyList.h"
 #include "platform/TelephonyService.h"
+#include "plist/PropertyList.h"
+#include "text/Bytes.h"
 
 #include <optional>
 #include <string>

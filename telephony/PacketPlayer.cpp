@@ -1,8 +1,8 @@
 #include "telephony/PacketPlayer.h"
 
 #include "platform/MainQueue.h"
-#include "platform/TimeGrid.h"
 #include "telephony/PacketSink.h"
+#include "timeline/TimeGrid.h"
 
 #include <algorithm>
 #include <cmath>

@@ -1,10 +1,10 @@
 #pragma once
 
 #include "host/PortFrame.h"
-#include "platform/Date.h"
-#include "platform/StampSequence.h"
 #include "telephony/CodeFilter.h"
 #include "telephony/PacketSource.h"
+#include "text/Date.h"
+#include "timeline/StampSequence.h"
 
 #include <chrono>
 #include <functional>

@@ -1,8 +1,8 @@
 #include "telephony/Relay.h"
 
-#include "platform/Format.h"
 #include "platform/MainQueue.h"
 #include "platform/RepeatingTimer.h"
+#include "text/Format.h"
 
 #include <deque>
 #include <utility>

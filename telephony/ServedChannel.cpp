@@ -1,9 +1,9 @@
 #include "telephony/ServedChannel.h"
 
 #include "host/SocketMessagePorts.h"
-#include "platform/Format.h"
 #include "platform/TelephonyConstants.h"
 #include "telephony/ControlMessages.h"
+#include "text/Format.h"
 
 #include <cerrno>
 

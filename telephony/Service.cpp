@@ -5,7 +5,6 @@
 #include "host/Descriptor.h"
 #include "host/Interruption.h"
 #include "host/SocketMessagePorts.h"
-#include "platform/Format.h"
 #include "telephony/RecordingSource.h"
 #include "telephony/Relay.h"
 #include "telephony/ServiceStatus.h"
@@ -13,6 +12,7 @@
 #include "telephony/StreamOpening.h"
 #include "telephony/StreamSource.h"
 #include "telephony/TelephonyServer.h"
+#include "text/Format.h"
 
 #include <array>
 #include <cerrno>

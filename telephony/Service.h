@@ -1,8 +1,8 @@
 #pragma once
 
+#include "simulator/Simulation.h"
 #include "telephony/ControlMessages.h"
 #include "telephony/PacketPlayer.h"
-#include "telephony/simulator/Simulation.h"
 
 #include <chrono>
 #include <functional>

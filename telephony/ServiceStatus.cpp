@@ -1,9 +1,9 @@
 #include "telephony/ServiceStatus.h"
 
 #include "host/SocketMessagePorts.h"
-#include "platform/Format.h"
-#include "platform/Printable.h"
 #include "telephony/ControlMessages.h"
+#include "text/Format.h"
+#include "text/Printable.h"
 
 #include <chrono>
 

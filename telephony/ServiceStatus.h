@@ -1,8 +1,8 @@
 #pragma once
 
 #include "host/HostError.h"
-#include "platform/PropertyList.h"
-#include "platform/Result.h"
+#include "plist/PropertyList.h"
+#include "text/Result.h"
 
 #include <cstdint>
 #include <optional>

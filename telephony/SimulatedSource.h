@@ -1,7 +1,7 @@
 #pragma once
 
+#include "simulator/Simulation.h"
 #include "telephony/PacketSource.h"
-#include "telephony/simulator/Simulation.h"
 
 namespace pallax {
 

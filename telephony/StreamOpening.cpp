@@ -1,6 +1,6 @@
 #include "telephony/StreamOpening.h"
 
-#include "platform/Format.h"
+#include "text/Format.h"
 
 #include <condition_variable>
 #include <mutex>

@@ -2,8 +2,8 @@
 
 #include "host/HostError.h"
 #include "host/Recording.h"
-#include "platform/Result.h"
 #include "telephony/Relay.h"
+#include "text/Result.h"
 
 #include <chrono>
 #include <functional>

@@ -2,9 +2,9 @@
 
 #include "host/AsioMainQueue.h"
 #include "host/SocketMessagePorts.h"
-#include "platform/Format.h"
 #include "platform/RepeatingTimer.h"
 #include "telephony/ServedChannel.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <cerrno>

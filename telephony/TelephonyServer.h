@@ -1,12 +1,12 @@
 #pragma once
 
 #include "host/HostError.h"
-#include "platform/Bytes.h"
-#include "platform/Result.h"
 #include "telephony/ControlMessages.h"
 #include "telephony/PacketPlayer.h"
 #include "telephony/PacketSource.h"
 #include "telephony/ServiceStatus.h"
+#include "text/Bytes.h"
+#include "text/Result.h"
 
 #include <chrono>
 #include <cstddef>

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/Formats.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <string_view>
 

@@ -2,7 +2,7 @@
 
 #include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 namespace pallax {
 

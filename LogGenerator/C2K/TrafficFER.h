@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/Description.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <optional>
 

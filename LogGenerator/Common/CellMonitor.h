@@ -2,7 +2,7 @@
 
 #include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/LogRecord.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <cstdint>
 #include <optional>

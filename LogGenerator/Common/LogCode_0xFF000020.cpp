@@ -1,7 +1,7 @@
 #include "LogGenerator/Common/LogCode_0xFF000020.h"
 
-#include "platform/PropertyListCodec.h"
 #include "platform/SystemLog.h"
+#include "plist/PropertyListCodec.h"
 
 namespace pallax {
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/LogRecord.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <exception>
 #include <string_view>

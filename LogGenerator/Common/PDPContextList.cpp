@@ -1,8 +1,8 @@
 #include "LogGenerator/Common/PDPContextList.h"
 
 #include "LogGenerator/Records/Description.h"
-#include "platform/PropertyListCodec.h"
 #include "platform/SystemLog.h"
+#include "plist/PropertyListCodec.h"
 
 namespace pallax {
 

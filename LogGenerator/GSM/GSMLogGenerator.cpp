@@ -1,7 +1,7 @@
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 
-#include "platform/Format.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
+#include "text/Format.h"
 
 #include <utility>
 

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/LogGenerator.h"
-#include "platform/Text.h"
+#include "text/Text.h"
 
 #include <memory>
 #include <stdexcept>

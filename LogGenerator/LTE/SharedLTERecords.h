@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/LogCode.h"
-#include "platform/NumberFormat.h"
+#include "text/NumberFormat.h"
 
 #include <cstddef>
 

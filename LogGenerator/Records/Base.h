@@ -5,7 +5,7 @@
 #include "LogGenerator/Records/FieldGroup.h"
 #include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <cstdint>
 #include <map>

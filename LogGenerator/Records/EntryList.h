@@ -2,7 +2,7 @@
 
 #include "LogGenerator/Records/Exceptions.h"
 #include "LogGenerator/Records/LogRecord.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <algorithm>
 #include <cstddef>

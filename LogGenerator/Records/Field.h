@@ -3,7 +3,7 @@
 #include "LogGenerator/Records/Formats.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "LogGenerator/Records/ShownAs.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <cstdint>
 #include <span>

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "platform/Bytes.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
+#include "text/Bytes.h"
 
 #include <cstddef>
 #include <cstdint>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/NumberFormat.h"
+#include "text/NumberFormat.h"
 
 #include <cstdint>
 #include <optional>

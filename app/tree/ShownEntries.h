@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <memory>
 #include <string>

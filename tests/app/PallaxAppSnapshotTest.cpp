@@ -1,5 +1,5 @@
 #include "LogGenerator/Technologies/Technologies.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/app/AppFixture.h"
 #include "tests/doubles/InOrder.h"
 #include "tests/doubles/RecordBuilder.h"

@@ -1,6 +1,6 @@
-#include "platform/NumberFormat.h"
 #include "tests/app/PaneFixture.h"
 #include "tests/doubles/Property.h"
+#include "text/NumberFormat.h"
 
 #include <rapidcheck.h>
 

@@ -1,6 +1,6 @@
 #include "app/PallaxSaveViewController.h"
 
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/doubles/FakeFileSystem.h"
 #include "tests/doubles/FakeToolkit.h"
 #include "tests/doubles/InOrder.h"

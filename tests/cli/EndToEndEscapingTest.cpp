@@ -1,6 +1,6 @@
-#include "platform/Utf8.h"
 #include "tests/cli/EndToEndScreen.h"
 #include "tests/doubles/TextPropertyList.h"
+#include "text/Utf8.h"
 
 #include <algorithm>
 

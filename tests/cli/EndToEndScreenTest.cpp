@@ -1,6 +1,6 @@
 #include "tests/cli/EndToEndScreen.h"
 
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 
 #include <csignal>
 #include <filesystem>

@@ -1,5 +1,5 @@
 #include "host/Recording.h"
-#include "telephony/simulator/Simulation.h"
+#include "simulator/Simulation.h"
 #include "tests/cli/EndToEnd.h"
 #include "tests/doubles/Files.h"
 

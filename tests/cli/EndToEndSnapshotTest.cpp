@@ -1,5 +1,5 @@
 #include "host/Descriptor.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/cli/EndToEndScreen.h"
 
 #include <algorithm>

@@ -4,7 +4,7 @@
 #include "host/BuildBundle.h"
 #include "host/DirectoryResources.h"
 #include "host/Recording.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 #include "tests/doubles/ManualClock.h"
 
 #include <gtest/gtest.h>

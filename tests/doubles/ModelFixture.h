@@ -1,7 +1,7 @@
 #pragma once
 
 #include "monitor/PallaxModel.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/doubles/FakeBundle.h"
 #include "tests/doubles/FakeGenerator.h"
 #include "tests/doubles/FakePorts.h"

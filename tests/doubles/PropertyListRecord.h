@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/doubles/RecordBuilder.h"
 
 #include <gtest/gtest.h>

@@ -2,7 +2,7 @@
 
 #include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
-#include "platform/Bytes.h"
+#include "text/Bytes.h"
 
 #include <algorithm>
 #include <cstdint>

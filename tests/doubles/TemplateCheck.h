@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/ClassIndex.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/doubles/Files.h"
 
 #include <gtest/gtest.h>

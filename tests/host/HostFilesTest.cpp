@@ -5,7 +5,7 @@
 #include "host/Files.h"
 #include "host/HostFileSystem.h"
 #include "host/WallClock.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/doubles/RuntimeFolder.h"
 
 #include <gmock/gmock.h>

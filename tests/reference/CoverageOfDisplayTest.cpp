@@ -1,6 +1,6 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "samples/Samples.h"
-#include "telephony/simulator/Simulation.h"
+#include "simulator/Simulation.h"
 #include "tests/doubles/GeneratorFixture.h"
 #include "tests/reference/ReferenceFixture.h"
 

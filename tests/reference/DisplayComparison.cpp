@@ -1,10 +1,10 @@
 #include "tests/reference/DisplayComparison.h"
 
 #include "host/RecordingWriter.h"
-#include "platform/Printable.h"
-#include "platform/Utf8.h"
 #include "samples/Sample.h"
 #include "tests/reference/ReferenceFixture.h"
+#include "text/Printable.h"
+#include "text/Utf8.h"
 
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>

@@ -1,9 +1,9 @@
 #pragma once
 
-#include "platform/Bytes.h"
 #include "tests/doubles/Files.h"
 #include "tests/doubles/Shell.h"
 #include "tests/reference/AnalyserTree.h"
+#include "text/Bytes.h"
 
 #include <cstddef>
 #include <string>

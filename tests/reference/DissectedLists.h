@@ -1,8 +1,8 @@
 #pragma once
 
-#include "platform/PropertyListCodec.h"
 #include "platform/TelephonyConstants.h"
-#include "telephony/simulator/common/PropertyListRecord.h"
+#include "plist/PropertyListCodec.h"
+#include "simulator/common/PropertyListRecord.h"
 #include "tests/doubles/RecordBuilder.h"
 #include "tests/doubles/TextPropertyList.h"
 #include "tests/reference/DisplayComparison.h"

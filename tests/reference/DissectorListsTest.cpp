@@ -1,5 +1,5 @@
 #include "host/Recording.h"
-#include "telephony/simulator/SimulatedRecording.h"
+#include "simulator/SimulatedRecording.h"
 #include "tests/reference/DissectedLists.h"
 
 #include <gtest/gtest.h>

@@ -1,6 +1,6 @@
-#include "platform/PropertyListCodec.h"
 #include "platform/TelephonyConstants.h"
-#include "telephony/simulator/common/PropertyListRecord.h"
+#include "plist/PropertyListCodec.h"
+#include "simulator/common/PropertyListRecord.h"
 #include "tests/doubles/RecordBuilder.h"
 #include "tests/doubles/Shell.h"
 #include "tests/doubles/TextPropertyList.h"

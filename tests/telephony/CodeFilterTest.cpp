@@ -1,6 +1,6 @@
 #include "telephony/CodeFilter.h"
 
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 
 #include <gtest/gtest.h>
 

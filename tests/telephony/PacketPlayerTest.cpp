@@ -1,6 +1,6 @@
 #include "telephony/PacketPlayer.h"
 
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 #include "telephony/PacketSink.h"
 #include "tests/doubles/SteppedQueue.h"
 

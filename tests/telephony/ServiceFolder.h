@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/RecordingWriter.h"
-#include "platform/PropertyList.h"
+#include "plist/PropertyList.h"
 #include "tests/doubles/PortPair.h"
 
 #include <stdexcept>

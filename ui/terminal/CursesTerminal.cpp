@@ -1,7 +1,7 @@
 #include "ui/terminal/CursesTerminal.h"
 
-#include "platform/Base64.h"
-#include "platform/Utf8.h"
+#include "text/Base64.h"
+#include "text/Utf8.h"
 #include "ui/terminal/Curses.h"
 #include "ui/terminal/CursesCapability.h"
 #include "ui/terminal/CursesKeys.h"

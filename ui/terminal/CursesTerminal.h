@@ -1,6 +1,6 @@
 #pragma once
 
-#include "platform/Result.h"
+#include "text/Result.h"
 #include "ui/terminal/Grid.h"
 #include "ui/terminal/Keys.h"
 #include "ui/terminal/Marks.h"

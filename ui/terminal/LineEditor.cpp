@@ -1,6 +1,6 @@
 #include "ui/terminal/LineEditor.h"
 
-#include "platform/Utf8.h"
+#include "text/Utf8.h"
 #include "ui/terminal/TextWidth.h"
 
 #include <utility>

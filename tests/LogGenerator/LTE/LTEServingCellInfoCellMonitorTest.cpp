@@ -1,5 +1,5 @@
 #include "LogGenerator/LTE/LTEServingCellInfo.h"
-#include "platform/PropertyListCodec.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/doubles/CellBuilder.h"
 #include "tests/doubles/RecordFixture.h"
 

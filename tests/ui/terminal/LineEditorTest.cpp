@@ -1,7 +1,7 @@
 #include "ui/terminal/LineEditor.h"
 
-#include "platform/Utf8.h"
 #include "tests/doubles/Property.h"
+#include "text/Utf8.h"
 #include "ui/terminal/TextWidth.h"
 
 #include <gtest/gtest.h>

@@ -3,11 +3,11 @@
 #include "app/PallaxPaneController.h"
 #include "app/PallaxSaveViewController.h"
 #include "app/tree/PallaxModelNode.h"
-#include "platform/Utf8.h"
 #include "platform/ui/Window.h"
 #include "tests/doubles/FakeFileSystem.h"
 #include "tests/doubles/ManualClock.h"
 #include "tests/doubles/SteppedQueue.h"
+#include "text/Utf8.h"
 #include "ui/terminal/FrontEnd.h"
 
 #include <memory>

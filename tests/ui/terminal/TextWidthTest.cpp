@@ -1,7 +1,7 @@
 #include "ui/terminal/TextWidth.h"
 
-#include "platform/Printable.h"
-#include "platform/Utf8.h"
+#include "text/Printable.h"
+#include "text/Utf8.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck.h>

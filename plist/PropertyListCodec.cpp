@@ -1,0 +1,49 @@
+#include "plist/PropertyListCodec.h"
+
+#include "text/Utf8.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kBinarySignature = "bplist";
+constexpr std::string_view kSpaces = " \t\r\n";
+
+/// The first bytes as text, which is all that telling the forms apart needs.
+std::string headOf(Bytes bytes, std::size_t start, std::size_t length) {
+    std::string head;
+    for (std::size_t at = start; at < bytes.size() && at - start < length; ++at) {
+        head += static_cast<char>(bytes[at]);
+    }
+    return head;
+}
+
+/// Data of the text form begins with "<" too, but goes on with a hex digit, white space or ">".
+bool looksLikeXml(Bytes bytes) {
+    const std::string mark = headOf(bytes, 0, kUtf8Mark.size());
+    if (mark.starts_with("\xFE\xFF") || mark.starts_with("\xFF\xFE")) {
+        return true; // UTF-16, which the XML reader refuses by its name
+    }
+    std::size_t at = mark == kUtf8Mark ? kUtf8Mark.size() : 0;
+    while (at < bytes.size() &&
+           kSpaces.find(static_cast<char>(bytes[at])) != std::string_view::npos) {
+        ++at;
+    }
+    const std::string opening = headOf(bytes, at, 2);
+    return opening == "<?" || opening == "<!" || opening == "<p";
+}
+
+} // namespace
+
+std::string CodecError::text() const {
+    return "at byte " + std::to_string(offset) + ": " + reason;
+}
+
+PropertyListResult parsePropertyList(Bytes bytes) {
+    if (headOf(bytes, 0, kBinarySignature.size()) == kBinarySignature) {
+        return parseBinaryPropertyList(bytes);
+    }
+    return looksLikeXml(bytes) ? parseXmlPropertyList(bytes) : parseTextPropertyList(bytes);
+}
+
+} // namespace pallax

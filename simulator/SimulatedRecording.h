@@ -1,0 +1,19 @@
+#pragma once
+
+#include "host/HostError.h"
+#include "simulator/Simulation.h"
+
+#include <functional>
+#include <optional>
+#include <string>
+
+namespace pallax {
+
+/// Writes a simulation with a duration as a recording to `path` ("-" is standard output), where
+/// an existing file is replaced. The sentence that tells why not, if it could not. `written`, if
+/// any, gets each packet's time.
+std::optional<HostError>
+writeSimulatedRecording(const SimulationOptions& options, const std::string& path,
+                        const std::function<void(Time time)>& written = {});
+
+} // namespace pallax

@@ -1,0 +1,119 @@
+// What a dictionary keeps to be quick must never show.
+
+#include "plist/PropertyList.h"
+#include "tests/doubles/InOrder.h"
+
+#include <gtest/gtest.h>
+#include <rapidcheck.h>
+
+#include <string>
+#include <utility>
+#include <vector>
+
+namespace pallax {
+namespace {
+
+using doubles::sameInOrder;
+
+/// What a dictionary does, done in the simplest way.
+class Model {
+public:
+    void set(const std::string& key, const std::string& value) {
+        for (auto& entry : _entries) {
+            if (entry.first == key) {
+                entry.second = value;
+                return;
+            }
+        }
+        _entries.emplace_back(key, value);
+    }
+    bool remove(const std::string& key) {
+        return std::erase_if(_entries, [&](const auto& entry) { return entry.first == key; }) != 0;
+    }
+    void truncate(std::size_t count) {
+        if (count < _entries.size()) {
+            _entries.resize(count);
+        }
+    }
+    bool isLike(const Dictionary& dictionary) const {
+        if (dictionary.size() != _entries.size()) {
+            return false;
+        }
+        auto at = dictionary.begin();
+        for (const auto& [key, value] : _entries) {
+            const PropertyList* found = dictionary.find(key);
+            if (at->key.view() != key || !(at->value == PropertyList(value)) ||
+                found != &at->value) {
+                return false;
+            }
+            ++at;
+        }
+        return true;
+    }
+
+private:
+    std::vector<std::pair<std::string, std::string>> _entries;
+};
+
+TEST(DictionaryProperty, WhateverIsDoneToItItHoldsWhatAPlainListWould) {
+    EXPECT_TRUE(rc::check([] {
+        Dictionary dictionary;
+        Model model;
+        const auto steps = *rc::gen::inRange(0, 120);
+        for (int step = 0; step < steps; ++step) {
+            const std::string key = std::to_string(*rc::gen::inRange(0, 40));
+            const std::string value = std::to_string(step);
+            switch (*rc::gen::inRange(0, 12)) {
+            case 0:
+                RC_ASSERT(dictionary.remove(key) == model.remove(key));
+                break;
+            case 1: {
+                const auto count = *rc::gen::inRange<std::size_t>(0, 50);
+                dictionary.truncate(count);
+                model.truncate(count);
+                break;
+            }
+            case 2:
+                dictionary = Dictionary(dictionary);
+                break;
+            case 3: {
+                Dictionary taken = std::move(dictionary);
+                dictionary = std::move(taken);
+                break;
+            }
+            default:
+                dictionary.set(key, value);
+                model.set(key, value);
+                break;
+            }
+            RC_ASSERT(model.isLike(dictionary));
+        }
+    }));
+}
+
+TEST(Dictionary, WhatWasMovedFromIsEmptyAndUsable) {
+    for (const int size : {3, 100}) {
+        Dictionary from;
+        for (int index = 0; index < size; ++index) {
+            from.set(std::to_string(index), "value");
+        }
+        const Dictionary to = std::move(from);
+        EXPECT_EQ(to.size(), static_cast<std::size_t>(size));
+        EXPECT_NE(to.find("2"), nullptr);
+        EXPECT_TRUE(from.empty()); // NOLINT(bugprone-use-after-move): what it is about
+        EXPECT_EQ(from.find("2"), nullptr);
+        from.setFixed("2", "new");
+        EXPECT_EQ(*from.find("2"), PropertyList("new"));
+    }
+}
+
+TEST(Dictionary, AValueToSetIsTheOneThereOrANewOne) {
+    Dictionary dictionary{{"A", "1"}, {"B", "2"}};
+    dictionary.valueToSet("B").assign(Text("3"));
+    dictionary.valueToSet("A").assign(Text("4"));
+    EXPECT_TRUE(dictionary.valueToSet("C").isNull());
+    EXPECT_TRUE(sameInOrder(dictionary, Dictionary{{"A", "4"}, {"B", "3"}, {"C", PropertyList()}}));
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,47 @@
+#pragma once
+
+#include "tests/doubles/Property.h"
+#include "tests/simulator/SimulatedPhone.h"
+
+#include <rapidcheck.h> // for RC_ASSERT
+
+#include <string>
+#include <vector>
+
+/// Random values that an encoder takes, and how a display tells them.
+namespace pallax {
+
+inline unsigned below(unsigned bound) {
+    return static_cast<unsigned>(doubles::any::between(0, static_cast<int>(bound)));
+}
+inline int between(int least, int bound) {
+    return doubles::any::between(least, bound);
+}
+/// A level on the grid of a record: `least` plus a number of steps.
+inline double onGrid(double least, double step, unsigned count) {
+    return least + step * below(count);
+}
+inline std::string text(unsigned number) {
+    return std::to_string(number);
+}
+
+/// One of a record's labels, with the number that stands for it.
+template <class Number = unsigned>
+struct Labelled {
+    Number number;
+    std::string label;
+};
+template <class Number>
+Labelled<Number> oneOf(const std::vector<Labelled<Number>>& all) {
+    return all[below(static_cast<unsigned>(all.size()))];
+}
+
+/// The display of that technology after the record of `value`.
+template <class Value>
+void feedEncoded(DecodedDisplay& decoded, const Value& value) {
+    ByteBuffer bytes;
+    encode(value, bytes); // found in the namespace of the value
+    decoded.feed(bytes);
+}
+
+} // namespace pallax
