@@ -278,6 +278,14 @@ PropertyList& Dictionary::searchedOrAppended(std::string_view key) {
     return _entries[at].value;
 }
 
+PropertyList& Dictionary::appendedInOrder(std::string_view key) {
+    const std::size_t at = _next;
+    truncate(at);
+    append(Text::fixed(key), {}, true);
+    _next = at + 1;
+    return _entries.back().value;
+}
+
 void Dictionary::appendForeignKey(const PropertyList& key, PropertyList value) {
     append(key.description(), std::move(value), false);
 }

@@ -172,6 +172,15 @@ public:
         return _next < _entries.size() && isAt(_next, key) ? _entries[_next++].value
                                                            : searchedOrAppended(key);
     }
+    /// For a dictionary that is filled again from its start: the value under the key that follows
+    /// the one set last. Where another key follows, it and all after it are removed.
+    PropertyList& valueInOrder(std::string_view key) {
+        return _next < _entries.size() && isAt(_next, key) ? _entries[_next++].value
+                                                           : appendedInOrder(key);
+    }
+    void startOver() { _next = 0; }
+    /// Removes what follows the key set last.
+    void dropRest() { truncate(_next); }
     void appendForeignKey(const PropertyList& key, PropertyList value);
     /// True when there was something to remove.
     bool remove(std::string_view key);
@@ -199,6 +208,7 @@ private:
     }
     std::size_t indexOf(std::string_view key) const;
     PropertyList& searchedOrAppended(std::string_view key);
+    PropertyList& appendedInOrder(std::string_view key);
     void append(Text key, PropertyList value, bool isStringKey);
     void rebuildIndex();
 

@@ -113,17 +113,17 @@ void addRun(LuaTable& table, const EntryRun& run) {
     }
 }
 
-std::string_view nameOf(ListPart::Kind kind) {
+std::string_view nameOf(ListPartDescription::Kind kind) {
     switch (kind) {
-    case ListPart::Kind::Keys:
+    case ListPartDescription::Kind::Keys:
         return "keys";
-    case ListPart::Kind::Elements:
+    case ListPartDescription::Kind::Elements:
         return "elements";
-    case ListPart::Kind::FirstCell:
+    case ListPartDescription::Kind::FirstCell:
         return "first cell";
-    case ListPart::Kind::EachCell:
+    case ListPartDescription::Kind::EachCell:
         return "each cell";
-    case ListPart::Kind::CellEntries:
+    case ListPartDescription::Kind::CellEntries:
         break;
     }
     return "cell entries";
@@ -190,7 +190,7 @@ std::string luaField(const FieldDescription& field, const std::string& filter) {
     return table.str();
 }
 
-std::string luaListPart(const ListPart& part) {
+std::string luaListPart(const ListPartDescription& part) {
     LuaTable table;
     table.text("part", nameOf(part.kind));
     if (!part.technologies.empty()) {

@@ -197,18 +197,18 @@ std::string countOf(const ListDescription& list) {
 }
 
 /// "the first serving cell of GSM or UMTS"
-std::string inWords(const ListPart& part) {
+std::string inWords(const ListPartDescription& part) {
     if (!part.words.empty()) {
         return std::string(part.words);
     }
-    std::string text(part.kind == ListPart::Kind::FirstCell ? "the first " : "each ");
+    std::string text(part.kind == ListPartDescription::Kind::FirstCell ? "the first " : "each ");
     text += part.cellType == kHXCellMonitorCellTypeServing ? "serving cell" : "neighbour";
     std::string_view before = " of ";
     for (const std::string_view technology : part.technologies) {
         text.append(before).append(technology.substr(kRadioAccessTechnology.size()));
         before = " or ";
     }
-    return text + (part.kind == ListPart::Kind::EachCell ? ", so that the last one stays" : "");
+    return text + (part.kind == ListPartDescription::Kind::EachCell ? ", so that the last one stays" : "");
 }
 
 } // namespace

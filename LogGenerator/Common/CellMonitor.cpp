@@ -22,6 +22,23 @@ bool holds(const Dictionary& cell, std::string_view key, std::string_view value)
 
 } // namespace
 
+std::optional<PropertyList> parseCellMonitorArrayQuietly(const LogRecord& record) {
+    PropertyListResult parsed = record.payloadAsPropertyList();
+    if (!parsed) {
+        systemLog(LogPriority::Error, "Cell Info Array data could not be constructed");
+        return std::nullopt;
+    }
+    return std::move(parsed).value();
+}
+
+std::optional<PropertyList> parseCellMonitorArray(const LogRecord& record) {
+    std::optional<PropertyList> cells = parseCellMonitorArrayQuietly(record);
+    if (!cells) {
+        logNoCellArray();
+    }
+    return cells;
+}
+
 std::optional<Array> readCellMonitorArray(const LogRecord& record) {
     const PropertyListResult parsed = record.payloadAsPropertyList();
     if (!parsed) {
@@ -114,7 +131,7 @@ Array cellEntries(const Array& cells, std::string_view radioAccessTechnology,
     return entries;
 }
 
-CodeDescription describeCells(ListPart part, std::span<const CellNumber> numbers,
+CodeDescription describeCells(ListPartDescription part, std::span<const CellNumber> numbers,
                               std::span<const CellLevel> levels) {
     CodeDescription code{kCellMonitorLogCode};
     code.listPart = std::move(part);

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/Description.h"
+#include "LogGenerator/Records/Layout.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "plist/PropertyList.h"
 
@@ -13,6 +14,37 @@
 /// property list, an array of dictionaries, one for each cell that the telephony service knows,
 /// keyed by its `kHXCellMonitor…` constants.
 namespace pallax {
+
+inline constexpr std::string_view kCellMonitorName = "Cell monitor";
+/// For layouts with levels.
+inline constexpr std::string_view kLevelsNote =
+    "Of a level only the low 16 bits count, as a signed number.";
+
+/// The array; nothing, with two lines in the log, when the payload is no property list.
+std::optional<PropertyList> parseCellMonitorArray(const LogRecord& record);
+/// The same with the first of the two lines.
+std::optional<PropertyList> parseCellMonitorArrayQuietly(const LogRecord& record);
+
+/// A key that shows a cell's number as decimal text. `failure` is logged where the cell has none.
+constexpr Field cellNumber(std::string_view key, std::string_view cellKey, std::string_view failure,
+                           std::string_view meaning = {}) {
+    Field field{key, std::nullopt, Conversion::number(), meaning};
+    field.listKey = cellKey;
+    field.failure = failure;
+    return field;
+}
+
+/// A key that shows a cell's number as a level: the low 16 bits, signed, times `factor`, under
+/// `format`; the empty string for 32767, which stands for "not measured".
+constexpr Field cellLevel(std::string_view key, std::string_view cellKey, std::string_view failure,
+                          const NumberFormat& format, double factor = 1.0,
+                          std::string_view meaning = {}) {
+    constexpr std::int64_t kNotMeasured = 32767;
+    Field field = cellNumber(key, cellKey, failure, meaning);
+    field.conversion = Conversion::number(format, factor).except(kNotMeasured, "");
+    field.listBits = 16;
+    return field;
+}
 
 /// The array's elements; none when the root is no array. Nothing, with "Cell Info Array data could
 /// not be constructed" in the log, when the payload is no property list.
@@ -76,7 +108,7 @@ Array cellEntries(const Array& cells, std::string_view radioAccessTechnology,
                   std::span<const CellLevel> levels);
 
 /// What `showCellNumbers` and `showCellLevels` show of that part of the array.
-CodeDescription describeCells(ListPart part, std::span<const CellNumber> numbers,
+CodeDescription describeCells(ListPartDescription part, std::span<const CellNumber> numbers,
                               std::span<const CellLevel> levels);
 
 } // namespace pallax

@@ -27,7 +27,7 @@ void PDPContextList::updateWithData(const LogRecord& record, LogCode /*logCode*/
 
 RecordDescription PDPContextList::describe() const {
     CodeDescription code{kPDPContextsLogCode};
-    code.listPart = {.kind = ListPart::Kind::Elements,
+    code.listPart = {.kind = ListPartDescription::Kind::Elements,
                      .words = "the array of contexts, as the telephony service describes them"};
     return {std::move(code)};
 }

@@ -54,7 +54,7 @@ void SimInfo::updateWithData(const LogRecord& record, LogCode logCode) {
 
 RecordDescription SimInfo::describe() const {
     CodeDescription code{kSimFilesLogCode};
-    code.listPart = {.kind = ListPart::Kind::Keys,
+    code.listPart = {.kind = ListPartDescription::Kind::Keys,
                      .words = "the dictionary of SIM files; values of any type, as they come"};
     for (const SimFile& simFile : kSimFiles) {
         FieldDescription field{std::string(simFile.key)};

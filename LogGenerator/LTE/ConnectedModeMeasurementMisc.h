@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -14,15 +14,9 @@ namespace pallax {
 ///   21    16     Subframe Number           number
 ///   23    16     Serving Filtered RSRP     raw x 0.25 - 140, dBm
 ///   25    16     Serving Filtered RSRQ     raw x 0.125 - 20, dB
-class ConnectedModeMeasurementMisc final : public Base {
+class ConnectedModeMeasurementMisc final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override {
-        return "Connected mode LTE Intra-frequency Measurement";
-    }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    ConnectedModeMeasurementMisc();
 };
 
 } // namespace pallax

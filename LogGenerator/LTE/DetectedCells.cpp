@@ -1,9 +1,6 @@
 #include "LogGenerator/LTE/DetectedCells.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
-#include "LogGenerator/Records/Description.h"
-#include "LogGenerator/Records/EntryList.h"
-#include "platform/SystemLog.h"
 
 #include <array>
 
@@ -11,55 +8,37 @@ namespace pallax {
 
 namespace {
 
-constexpr auto kLogCodes = std::to_array<LogCode>({kConnectedModeLogCode});
-
 constexpr auto kCellFields = std::to_array<Field>({
-    {"Physical Cell ID", u16At(0), Conversion::number()},
+    Field{"Physical Cell ID", u16At(0), Conversion::number(),
+          "Physical cell identity of the detected cell."}
+        .identifying(),
 });
 
-/// They stand behind the measured neighbours.
-EntryList::Layout layoutOf(const LogRecord& record) {
-    const std::size_t measured = record.u8(kMeasuredCountOffset);
-    return {.start = kConnectedModeLength + measured * kMeasuredEntryLength,
-            .stride = kDetectedEntryLength,
-            .bytesRead = 2};
-}
+/// They follow the measured neighbours.
+constexpr auto kLists = std::to_array<ListLayout>({{
+    .entries = {{.start = kConnectedModeLength, .stride = kDetectedEntryLength, .bytesRead = 2},
+                EntryRun::Move{kMeasuredEntryLength, u8At(kMeasuredCountOffset)}},
+    .count = u8At(kDetectedCountOffset),
+    .fields = kCellFields,
+}});
+
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = kConnectedModeLogCode,
+    .minimumLength = kConnectedModeLength,
+    .lists = kLists,
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "Detected Cells",
+    .logLine = "Detected Cells",
+    .kind = SectionKind::List,
+    .meaning = "The cells on the serving frequency that are detected in connected mode, but not "
+               "measured.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> DetectedCells::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void DetectedCells::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "Detected Cells");
-    if (logCode != kConnectedModeLogCode) {
-        return logUnknown(logCode);
-    }
-    if (!record.has(kConnectedModeLength)) {
-        return;
-    }
-    clearList();
-    const EntryList cells(record, layoutOf(record), record.u8(kDetectedCountOffset));
-    if (cells.count() != 0) {
-        replaceList(cells, [](Dictionary& target, const LogRecord& entry) {
-            fillEntry(target, kCellFields, entry);
-        });
-    }
-}
-
-bool DetectedCells::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return logCode == kConnectedModeLogCode && record.has(kConnectedModeLength);
-}
-
-RecordDescription DetectedCells::describe() const {
-    const EntryList::Layout behindNoNeighbours = layoutOf(LogRecord());
-    ListDescription list =
-        describeList("", behindNoNeighbours, u8At(kDetectedCountOffset), kCellFields);
-    list.entries.move = EntryRun::Move{kMeasuredEntryLength, u8At(kMeasuredCountOffset)};
-    CodeDescription code{kConnectedModeLogCode, kConnectedModeLength};
-    code.lists = {std::move(list)};
-    return {std::move(code)};
-}
+DetectedCells::DetectedCells() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -14,14 +14,9 @@ namespace pallax {
 ///
 /// The size check of MeasuredNeighborCells is not made here: what that one refuses may well fill
 /// this list.
-class DetectedCells final : public Base {
+class DetectedCells final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Detected Cells"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    DetectedCells();
 };
 
 } // namespace pallax

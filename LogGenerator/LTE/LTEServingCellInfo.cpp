@@ -1,8 +1,6 @@
 #include "LogGenerator/LTE/LTEServingCellInfo.h"
 
 #include "LogGenerator/Common/CellMonitor.h"
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
 #include "platform/TelephonyConstants.h"
 
 #include <array>
@@ -10,14 +8,6 @@
 namespace pallax {
 
 namespace {
-
-constexpr LogCode kIdentityLogCode = 0xB0C2;
-constexpr LogCode kAntennasLogCode = 0xB0C1;
-constexpr auto kLogCodes =
-    std::to_array<LogCode>({kIdentityLogCode, kAntennasLogCode, kCellMonitorLogCode});
-
-constexpr std::size_t kIdentityRecordLength = 38;
-constexpr std::size_t kAntennasRecordLength = 22;
 
 /// By the number of resource blocks.
 constexpr auto kBandwidths = [] {
@@ -39,91 +29,87 @@ constexpr std::string_view kBandKey = "Freq Band Indicator";
 constexpr std::string_view kUarfcnKey = "UARFCN";
 
 constexpr auto kIdentityFields = std::to_array<Field>({
-    {kPhysicalCellIdKey, u16At(14), Conversion::number()},
-    {"Download Frequency", u16At(16), Conversion::number()},
-    {"Upload Frequency", u16At(18), Conversion::number()},
-    {"Download Bandwidth", u8At(20), Conversion::label(kBandwidths)},
-    {"Upload Bandwidth", u8At(21), Conversion::label(kBandwidths)},
-    {kCellIdentityKey, s32At(22), Conversion::number()},
-    {kTrackingAreaKey, u16At(26), Conversion::number()},
-    {kBandKey, s32At(28), Conversion::number()},
+    {kPhysicalCellIdKey, u16At(14), Conversion::number(),
+     "Physical cell identity of the serving cell, 0 to 503."},
+    {"Download Frequency", u16At(16), Conversion::number(), "EARFCN of the downlink carrier."},
+    {"Upload Frequency", u16At(18), Conversion::number(), "EARFCN of the uplink carrier."},
+    {"Download Bandwidth", u8At(20), Conversion::label(kBandwidths),
+     "Channel bandwidth of the downlink, reported in resource blocks."},
+    {"Upload Bandwidth", u8At(21), Conversion::label(kBandwidths),
+     "Channel bandwidth of the uplink, reported in resource blocks."},
+    {kCellIdentityKey, s32At(22), Conversion::number(),
+     "E-UTRAN cell identity, 28 bits: the eNodeB and the cell in it."},
+    {kTrackingAreaKey, u16At(26), Conversion::number(),
+     "Code of the tracking area that the cell belongs to."},
+    {kBandKey, s32At(28), Conversion::number(), "Number of the E-UTRA operating band."},
 });
+
+/// The cell monitor's, of the cell before.
+constexpr auto kForeignKeys = std::to_array<std::string_view>({kUarfcnKey});
 
 constexpr auto kAntennasFields = std::to_array<Field>({
-    {"Num Tx Antennas", u8At(20), Conversion::number()},
+    {"Num Tx Antennas", u8At(20), Conversion::number(),
+     "Number of transmit antenna ports of the cell."},
 });
 
-constexpr auto kCellNumbers = std::to_array<CellNumber>({
-    {kTrackingAreaKey, kHXCellMonitorTAC, "Serving Cell Info: Failed to retrieve TAC\n"},
-    {kCellIdentityKey, kHXCellMonitorCellId, "Serving Cell Info: Failed to retrieve Cell ID\n"},
-    {kPhysicalCellIdKey, kHXCellMonitorPID,
-     "Serving Cell Info: Failed to retrieve Physical Cell ID\n"},
-    {kBandKey, kHXCellMonitorBandInfo,
-     "Serving Cell Info: Failed to retrieve Freq Band Indicator\n"},
-    {kUarfcnKey, kHXCellMonitorUARFCN, "Serving Cell Info: Failed to retrieve UARFCN\n"},
+constexpr auto kCellFields = std::to_array<Field>({
+    cellNumber(kTrackingAreaKey, kHXCellMonitorTAC, "Serving Cell Info: Failed to retrieve TAC\n"),
+    cellNumber(kCellIdentityKey, kHXCellMonitorCellId,
+               "Serving Cell Info: Failed to retrieve Cell ID\n"),
+    cellNumber(kPhysicalCellIdKey, kHXCellMonitorPID,
+               "Serving Cell Info: Failed to retrieve Physical Cell ID\n"),
+    cellNumber(kBandKey, kHXCellMonitorBandInfo,
+               "Serving Cell Info: Failed to retrieve Freq Band Indicator\n"),
+    cellNumber(kUarfcnKey, kHXCellMonitorUARFCN, "Serving Cell Info: Failed to retrieve UARFCN\n",
+               "Channel number that the telephony service gives for the serving cell."),
 });
+constexpr auto kTechnologies =
+    std::to_array<std::string_view>({kHXCellMonitorRadioAccessTechnologyLTE});
+constexpr ListPart kServingCell{
+    .kind = ListPart::Kind::FirstCell,
+    .parse = parseCellMonitorArray,
+    .technologies = kTechnologies,
+    .cellType = kHXCellMonitorCellTypeServing,
+};
+
+/// Those who read logs expect the line after every antenna report.
+void logAntennas(const CodeLayout& code, const LogRecord& /*record*/) {
+    logUnknownLogCode(code.logCode);
+}
+
+constexpr auto kCodes = std::to_array<CodeLayout>({
+    {
+        .logCode = 0xB0C2,
+        .name = "Identity of the serving cell",
+        .minimumLength = 38,
+        .fields = kIdentityFields,
+        .removes = kForeignKeys,
+        .note = "Removes \"UARFCN\", which is of the cell before.",
+    },
+    {
+        .logCode = 0xB0C1,
+        .name = "Antennas of the serving cell",
+        .minimumLength = 22,
+        .fields = kAntennasFields,
+        .logs = logAntennas,
+    },
+    {
+        .logCode = kCellMonitorLogCode,
+        .name = kCellMonitorName,
+        .fields = kCellFields,
+        .listPart = &kServingCell,
+    },
+});
+
+constexpr RecordLayout kLayout{
+    .section = "Serving Cell Info",
+    .logLine = "LTE Serving Cell Info",
+    .meaning = "Identity, carrier and antennas of the serving cell.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> LTEServingCellInfo::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void LTEServingCellInfo::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "LTE Serving Cell Info");
-    switch (logCode) {
-    case kIdentityLogCode:
-        return updateIdentity(record);
-    case kAntennasLogCode:
-        return updateAntennas(record);
-    case kCellMonitorLogCode:
-        return updateFromCellMonitor(record);
-    default:
-        return logUnknown(logCode);
-    }
-}
-
-bool LTEServingCellInfo::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return logCode == kIdentityLogCode && record.has(kIdentityRecordLength);
-}
-
-void LTEServingCellInfo::updateIdentity(const LogRecord& record) {
-    if (record.has(kIdentityRecordLength)) {
-        removeKey(kUarfcnKey); // the cell monitor's, of the cell before
-        show(kIdentityFields, record);
-    }
-}
-
-void LTEServingCellInfo::updateAntennas(const LogRecord& record) {
-    if (record.has(kAntennasRecordLength)) {
-        show(kAntennasFields, record);
-        // Those who read logs expect the line behind every antenna report.
-        logUnknown(kAntennasLogCode);
-    }
-}
-
-void LTEServingCellInfo::updateFromCellMonitor(const LogRecord& record) {
-    const auto cells = readCellMonitorArray(record);
-    if (!cells) {
-        return logNoCellArray();
-    }
-    if (const PropertyList* cell = findCell(*cells, kHXCellMonitorRadioAccessTechnologyLTE,
-                                            kHXCellMonitorCellTypeServing)) {
-        showCellNumbers(sectionRef().dictionary(), kCellNumbers, *cell);
-    }
-}
-
-RecordDescription LTEServingCellInfo::describe() const {
-    CodeDescription identity{kIdentityLogCode, kIdentityRecordLength};
-    identity.fields = describeFields(kIdentityFields);
-    identity.note = "Removes \"UARFCN\", which is of the cell before.";
-    CodeDescription antennas{kAntennasLogCode, kAntennasRecordLength};
-    antennas.fields = describeFields(kAntennasFields);
-    return {std::move(identity), std::move(antennas),
-            describeCells(ListPart{ListPart::Kind::FirstCell,
-                                   {kHXCellMonitorRadioAccessTechnologyLTE},
-                                   kHXCellMonitorCellTypeServing},
-                          kCellNumbers, {})};
-}
+LTEServingCellInfo::LTEServingCellInfo() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

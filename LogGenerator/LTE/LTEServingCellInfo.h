@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -28,18 +28,9 @@ namespace pallax {
 ///   kHXCellMonitorPID       Physical Cell ID     number
 ///   kHXCellMonitorBandInfo  Freq Band Indicator  number
 ///   kHXCellMonitorUARFCN    UARFCN               number
-class LTEServingCellInfo final : public Base {
+class LTEServingCellInfo final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Serving Cell Info"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
-
-private:
-    void updateIdentity(const LogRecord& record);
-    void updateAntennas(const LogRecord& record);
-    void updateFromCellMonitor(const LogRecord& record);
+    LTEServingCellInfo();
 };
 
 } // namespace pallax

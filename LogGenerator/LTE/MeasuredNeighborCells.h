@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -21,14 +21,9 @@ namespace pallax {
 /// refused with a line in the log, and the list stays empty. That only the low bytes are compared
 /// lets some records pass that are too short, whose list then stops at the last whole entry, and
 /// refuses some that are long enough.
-class MeasuredNeighborCells final : public Base {
+class MeasuredNeighborCells final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Measured Neighbor Cells"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    MeasuredNeighborCells();
 };
 
 } // namespace pallax

@@ -1,21 +1,12 @@
 #include "LogGenerator/LTE/NeighborCellsList.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
-#include "LogGenerator/Records/Description.h"
-#include "LogGenerator/Records/EntryList.h"
-#include "platform/SystemLog.h"
 
 #include <array>
 
 namespace pallax {
 
 namespace {
-
-constexpr auto kLogCodes = std::to_array<LogCode>({kNeighborMeasurementLogCode});
-
-constexpr Position kCountLessOne = bitsAt(19, 6, 5);
-constexpr EntryList::Layout kCells{
-    .start = kNeighborMeasurementLength, .stride = 20, .bytesRead = 16};
 
 constexpr Conversion kPower = Conversion::number(kLevelDbm, 0.5, -140.0);
 constexpr Conversion kRsrq = Conversion::number(kLevelDb, 0.25, -30.0);
@@ -24,71 +15,82 @@ constexpr Position kFrameOffset = bitsAt(12, 0, 11);
 constexpr Position kSampleOffset = bitsAt(13, 3, 19);
 
 constexpr auto kCellFields = std::to_array<Field>({
-    {"Physical Cell ID", kPhysicalCellId, Conversion::number()},
-    {"Measured RSSI", bitsAt(1, 1, 8), kPower},
-    {"Measured RSRP", bitsAt(2, 1, 9), kPower},
-    {"Average RSRP", bitsAt(4, 0, 9), kPower},
-    {"Measured RSRQ", bitsAt(5, 1, 7), kRsrq},
-    {"Average RSRQ", bitsAt(6, 0, 7), kRsrq},
-    {"Srxlev", bitsAt(6, 7, 7), Conversion::number(kDecimalDbm, 1.0, -30.0)},
-    {"Frequency Offset", u16At(8), Conversion::number()},
-    {"Ant 0 Frame Offset", kFrameOffset, Conversion::number()},
-    {"Ant 0 Sample Offset", kSampleOffset, Conversion::number()},
-    {"Ant 1 Frame Offset", kFrameOffset, Conversion::number()},
-    {"Ant 1 Sample Offset", kSampleOffset, Conversion::number()},
+    Field{"Physical Cell ID", kPhysicalCellId, Conversion::number(),
+          "Physical cell identity of the neighbour."}
+        .identifying(),
+    {"Measured RSSI", bitsAt(1, 1, 8), kPower,
+     "Received signal strength over the carrier's whole bandwidth."},
+    {"Measured RSRP", bitsAt(2, 1, 9), kPower,
+     "Reference signal received power of the neighbour, as last measured."},
+    {"Average RSRP", bitsAt(4, 0, 9), kPower,
+     "Reference signal received power of the neighbour, averaged."},
+    {"Measured RSRQ", bitsAt(5, 1, 7), kRsrq,
+     "Reference signal received quality of the neighbour, as last measured."},
+    {"Average RSRQ", bitsAt(6, 0, 7), kRsrq,
+     "Reference signal received quality of the neighbour, averaged."},
+    {"Srxlev", bitsAt(6, 7, 7), Conversion::number(kDecimalDbm, 1.0, -30.0),
+     "Cell-selection receive level: by how much the level exceeds what the cell demands."},
+    {"Frequency Offset", u16At(8), Conversion::number(),
+     "Frequency offset of the neighbour, as the modem counts it; its unit is not known."},
+    {"Ant 0 Frame Offset", kFrameOffset, Conversion::number(),
+     "Frame timing of the neighbour at antenna 0, as the modem counts it."},
+    {"Ant 0 Sample Offset", kSampleOffset, Conversion::number(),
+     "Sample timing of the neighbour at antenna 0, as the modem counts it."},
+    {"Ant 1 Frame Offset", kFrameOffset, Conversion::number(),
+     "Frame timing of antenna 0 once more."},
+    {"Ant 1 Sample Offset", kSampleOffset, Conversion::number(),
+     "Sample timing of antenna 0 once more."},
 });
 static_assert(kCellFields.size() == 12);
 
+constexpr auto kLists = std::to_array<ListLayout>({{
+    .entries = {{.start = kNeighborMeasurementLength, .stride = 20, .bytesRead = 16}},
+    .count = bitsAt(19, 6, 5),
+    .fields = kCellFields,
+    .plus = 1,
+}});
+
 /// One line for the cell, and one for each of its levels: the values that are no whole numbers.
-void trace(const Dictionary& cell, std::int64_t physicalCellId) {
-    if (!SystemLog::isEnabled(LogPriority::Warning)) {
-        return;
-    }
-    systemLog(LogPriority::Warning, "Physical Cell ID: %d\n", physicalCellId);
-    for (const Dictionary::Entry& entry : cell) {
-        const DisplayNumber* number = entry.value.displayNumber();
-        if (number != nullptr && number->isReal()) {
-            systemLog(LogPriority::Warning, "Measured RSSI: %lf\n", number->real());
+void logCell(const LogRecord& cell) {
+    systemLog(LogPriority::Warning, "Physical Cell ID: %d\n", cell.read(kPhysicalCellId));
+    for (const Field& field : kCellFields) {
+        if (field.conversion.format->isReal()) {
+            const SampleValue level = field.conversion.valueOf(cell.read(*field.position));
+            systemLog(LogPriority::Warning, "Measured RSSI: %lf\n", level.number()->real());
         }
     }
 }
 
-void fillCell(Dictionary& cell, const LogRecord& entry) {
-    fillEntry(cell, kCellFields, entry);
-    trace(cell, entry.read(kPhysicalCellId));
+void logCells(const CodeLayout& /*code*/, const LogRecord& record) {
+    if (!SystemLog::isEnabled(LogPriority::Warning)) {
+        return;
+    }
+    const EntryList cells = kLists.front().entriesIn(record);
+    systemLog(LogPriority::Warning, "Number of neighboring cells being reported: %d\n",
+              cells.count());
+    const std::size_t whole = cells.wholeCount();
+    for (std::size_t index = 0; index < whole; ++index) {
+        logCell(cells.at(index));
+    }
 }
+
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = kNeighborMeasurementLogCode,
+    .minimumLength = kNeighborMeasurementLength,
+    .lists = kLists,
+    .logs = logCells,
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "Neighbor Cells List",
+    .logLine = "Neighbor Cells List",
+    .kind = SectionKind::List,
+    .meaning = "The neighbours measured in idle mode.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> NeighborCellsList::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void NeighborCellsList::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "Neighbor Cells List");
-    if (logCode != kNeighborMeasurementLogCode) {
-        return logUnknown(logCode);
-    }
-    if (!record.has(kNeighborMeasurementLength)) {
-        return;
-    }
-    clearList();
-    const auto count = static_cast<std::size_t>(record.read(kCountLessOne)) + 1;
-    systemLog(LogPriority::Warning, "Number of neighboring cells being reported: %d\n", count);
-    const EntryList cells(record, kCells, count);
-    replaceList(cells, fillCell);
-}
-
-bool NeighborCellsList::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return logCode == kNeighborMeasurementLogCode && record.has(kNeighborMeasurementLength);
-}
-
-RecordDescription NeighborCellsList::describe() const {
-    ListDescription list = describeList("", kCells, kCountLessOne, kCellFields);
-    list.plus = 1;
-    CodeDescription code{kNeighborMeasurementLogCode, kNeighborMeasurementLength};
-    code.lists = {std::move(list)};
-    return {std::move(code)};
-}
+NeighborCellsList::NeighborCellsList() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -29,14 +29,9 @@ namespace pallax {
 /// Antenna 1 repeats antenna 0. An RSRP step is 0.5 dB here, where the serving cell's is 0.25 dB.
 /// The number of entries that the record claims is logged, and behind it each whole entry's cell
 /// and five levels, all five under the label "Measured RSSI".
-class NeighborCellsList final : public Base {
+class NeighborCellsList final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Neighbor Cells List"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    NeighborCellsList();
 };
 
 } // namespace pallax

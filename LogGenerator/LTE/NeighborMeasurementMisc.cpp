@@ -1,8 +1,6 @@
 #include "LogGenerator/LTE/NeighborMeasurementMisc.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
 
 #include <array>
 
@@ -11,32 +9,28 @@ namespace pallax {
 namespace {
 
 constexpr auto kFields = std::to_array<Field>({
-    {"Version", u8At(13), Conversion::number()},
-    {"E-ARFCN", u16At(17), Conversion::number()},
-    {"Qrxlevmin", bitsAt(19, 0, 6), Conversion::number(kDecimalDbm, 2.0, -140.0)},
+    {"Version", u8At(13), Conversion::number(), "Version of the log record's layout."},
+    {"E-ARFCN", u16At(17), Conversion::number(), "EARFCN of the measured frequency."},
+    {"Qrxlevmin", bitsAt(19, 0, 6), Conversion::number(kDecimalDbm, 2.0, -140.0),
+     "Least RSRP that the frequency's cells demand."},
 });
 
-constexpr auto kGroups =
-    std::to_array<FieldGroup>({{kNeighborMeasurementLogCode, kNeighborMeasurementLength, kFields}});
-constexpr auto kLogCodes = logCodesOf(kGroups);
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = kNeighborMeasurementLogCode,
+    .name = "Idle-mode measurement of the neighbours",
+    .minimumLength = kNeighborMeasurementLength,
+    .fields = kFields,
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "Neighbor Measurements",
+    .logLine = "Neighbor Measurements",
+    .meaning = "What the idle-mode measurement of the neighbours has in common.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> NeighborMeasurementMisc::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void NeighborMeasurementMisc::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "Neighbor Measurements");
-    showGroup(kGroups, record, logCode);
-}
-
-bool NeighborMeasurementMisc::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return isOfGroup(kGroups, record, logCode);
-}
-
-RecordDescription NeighborMeasurementMisc::describe() const {
-    return describeGroups(kGroups);
-}
+NeighborMeasurementMisc::NeighborMeasurementMisc() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -12,13 +12,9 @@ namespace pallax {
 ///   13    0    8      Version    number
 ///   17    0    16     E-ARFCN    number
 ///   19    0    6      Qrxlevmin  raw x 2 - 140, dBm
-class NeighborMeasurementMisc final : public Base {
+class NeighborMeasurementMisc final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Neighbor Measurements"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    NeighborMeasurementMisc();
 };
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -34,14 +34,9 @@ namespace pallax {
 ///
 /// Entries stand 4 bytes apart, so that an entry's technology data is also the head of the entries
 /// behind it.
-class ReselectionCandidatesList final : public Base {
+class ReselectionCandidatesList final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Reselection Candidates List"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    ReselectionCandidatesList();
 };
 
 } // namespace pallax

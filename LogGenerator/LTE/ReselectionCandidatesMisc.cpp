@@ -1,8 +1,6 @@
 #include "LogGenerator/LTE/ReselectionCandidatesMisc.h"
 
 #include "LogGenerator/LTE/SharedLTERecords.h"
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
 
 #include <array>
 
@@ -11,32 +9,28 @@ namespace pallax {
 namespace {
 
 constexpr auto kFields = std::to_array<Field>({
-    {"Version", u8At(13), Conversion::number()},
-    {"Serving EARFCN", u16At(15), Conversion::number()},
-    {"Serving Cell ID", u16At(17), Conversion::number()},
+    {"Version", u8At(13), Conversion::number(), "Version of the log record's layout."},
+    {"Serving EARFCN", u16At(15), Conversion::number(), "EARFCN of the serving cell's downlink."},
+    {"Serving Cell ID", u16At(17), Conversion::number(),
+     "Physical cell identity of the serving cell."},
 });
 
-constexpr auto kGroups =
-    std::to_array<FieldGroup>({{kReselectionLogCode, kReselectionLength, kFields}});
-constexpr auto kLogCodes = logCodesOf(kGroups);
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = kReselectionLogCode,
+    .name = "Candidates of the idle-mode reselection",
+    .minimumLength = kReselectionLength,
+    .fields = kFields,
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "Reselection Candidates",
+    .logLine = "Reselection Candidates",
+    .meaning = "From where the phone looks for a cell to reselect.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> ReselectionCandidatesMisc::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void ReselectionCandidatesMisc::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "Reselection Candidates");
-    showGroup(kGroups, record, logCode);
-}
-
-bool ReselectionCandidatesMisc::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return isOfGroup(kGroups, record, logCode);
-}
-
-RecordDescription ReselectionCandidatesMisc::describe() const {
-    return describeGroups(kGroups);
-}
+ReselectionCandidatesMisc::ReselectionCandidatesMisc() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

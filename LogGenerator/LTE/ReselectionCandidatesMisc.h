@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -12,13 +12,9 @@ namespace pallax {
 ///   13    8      Version          number
 ///   15    16     Serving EARFCN   number
 ///   17    16     Serving Cell ID  number
-class ReselectionCandidatesMisc final : public Base {
+class ReselectionCandidatesMisc final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Reselection Candidates"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    ReselectionCandidatesMisc();
 };
 
 } // namespace pallax

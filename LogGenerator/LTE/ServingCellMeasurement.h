@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -30,13 +30,9 @@ namespace pallax {
 ///
 /// "Max UE Tx Power" is too narrow ever to hold 64, so that it is always shown as a power. The two
 /// search thresholds are of one kind, and yet one is shown in dB and the other in dBm.
-class ServingCellMeasurement final : public Base {
+class ServingCellMeasurement final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Serving Cell Measurements"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    ServingCellMeasurement();
 };
 
 } // namespace pallax

@@ -3,6 +3,7 @@
 #include "LogGenerator/Records/EntryList.h"
 #include "LogGenerator/Records/Field.h"
 #include "LogGenerator/Records/FieldGroup.h"
+#include "LogGenerator/Records/Layout.h"
 #include "LogGenerator/Records/LogCode.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "plist/PropertyList.h"
@@ -27,9 +28,6 @@ using ClassDict = std::map<std::string, Base*, std::less<>>;
 /// Log code to the records subscribed to it, in order of registration.
 using CodeDict = std::map<LogCode, std::vector<Base*>>;
 
-/// What a record writes into: the two kinds of section that a template holds.
-enum class SectionKind { Keys, List };
-
 /// A record: owns one named section of the display, subscribes to log codes, and turns each log
 /// record that arrives under one of them into display values.
 ///
@@ -50,14 +48,14 @@ public:
     void initWithDict(ClassDict& classDict, CodeDict& codeDict);
 
     /// The section that the template processing has built: a dictionary or an array.
-    void updateSectionRef(PropertyList section);
+    virtual void updateSectionRef(PropertyList section);
 
     /// One log record, header included, under its effective code: read now, or kept until `catchUp`
     /// or until one arrives that does not replace it. What is shown then, and what is logged and
     /// thrown now, is as if it were always read now.
-    void receive(const LogRecord& record, LogCode logCode);
+    virtual void receive(const LogRecord& record, LogCode logCode);
     /// Reads the record that was kept. To be called before anybody looks at the section.
-    void catchUp();
+    virtual void catchUp();
 
     /// One log record, header included, under its effective code.
     virtual void updateWithData(const LogRecord& record, LogCode logCode);

@@ -1,10 +1,75 @@
 #include "LogGenerator/Records/Description.h"
 
+#include <optional>
+#include <utility>
+
 namespace pallax {
 
-Extent extentOf(const Position& position, Extent::Origin origin) {
-    constexpr unsigned kByteBits = 8;
-    return {position.byte, (position.bit + position.width + kByteBits - 1) / kByteBits, origin};
+namespace {
+
+template <class Value>
+std::optional<Value> copyOf(const Value* value) {
+    return value != nullptr ? std::optional<Value>(*value) : std::nullopt;
+}
+
+ListDescription describe(const ListLayout& layout);
+
+std::vector<ListDescription> describe(std::span<const ListLayout> lists) {
+    std::vector<ListDescription> descriptions;
+    for (const ListLayout& list : lists) {
+        descriptions.push_back(describe(list));
+    }
+    return descriptions;
+}
+
+ListDescription describe(const ListLayout& layout) {
+    ListDescription list;
+    list.key = layout.key;
+    list.entries = layout.entries;
+    list.count = layout.count;
+    list.plus = layout.plus;
+    list.fit = static_cast<ListDescription::Fit>(layout.fit);
+    list.sizeCheck = layout.sizeCheck;
+    list.fields = describeFields(layout.fields);
+    list.lists = describe(layout.lists);
+    list.only = copyOf(layout.only);
+    list.companion = layout.companion;
+    list.entryName = layout.entryName;
+    list.ifEmpty = layout.ifEmpty;
+    list.formula = layout.formula;
+    list.staysWithoutEntries = layout.staysWithoutEntries;
+    list.isShown = layout.isShown;
+    list.rememberedAs = layout.rememberedAs;
+    return list;
+}
+
+} // namespace
+
+CodeDescription describe(const CodeLayout& layout) {
+    CodeDescription code{layout.logCode, layout.minimumLength, layout.exactLength,
+                         copyOf(layout.condition)};
+    code.fields = describeFields(layout.fields);
+    code.lists = describe(layout.lists);
+    for (const SubpacketLayout& subpacket : layout.subpackets) {
+        code.subpackets.push_back(
+            {subpacket.id, describeFields(subpacket.fields), describe(subpacket.lists)});
+    }
+    if (const ListPart* part = layout.listPart) {
+        code.listPart = ListPartDescription{part->kind,
+                                            {part->technologies.begin(), part->technologies.end()},
+                                            part->cellType,
+                                            part->words};
+    }
+    code.note = layout.note;
+    return code;
+}
+
+RecordDescription describe(const RecordLayout& layout) {
+    RecordDescription description;
+    for (const CodeLayout& code : layout.codes) {
+        description.push_back(describe(code));
+    }
+    return description;
 }
 
 FieldDescription describeComputed(std::string_view key, const NumberFormat& format,
@@ -19,7 +84,17 @@ FieldDescription describeComputed(std::string_view key, const NumberFormat& form
 }
 
 FieldDescription describeField(const Field& field) {
-    return {std::string(field.key), field.position, field.conversion.shownAs()};
+    FieldDescription description{std::string(field.key), field.position, field.conversion};
+    description.listKey = field.listKey;
+    description.listBits = field.listBits;
+    if (const Computation* computation = field.computation) {
+        description.formula = computation->formula;
+        description.computation = computation->name;
+        description.read.assign(computation->read.begin(), computation->read.end());
+        description.counters.assign(computation->counters.begin(), computation->counters.end());
+    }
+    description.condition = copyOf(field.condition);
+    return description;
 }
 
 std::vector<FieldDescription> describeFields(std::span<const Field> fields) {

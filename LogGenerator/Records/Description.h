@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Records/EntryList.h"
 #include "LogGenerator/Records/FieldGroup.h"
+#include "LogGenerator/Records/Layout.h"
 #include "LogGenerator/Records/ShownAs.h"
 
 #include <cstddef>
@@ -20,37 +21,6 @@
 /// or a subpacket. Texts have static storage duration unless they are std::string.
 namespace pallax {
 
-/// Bytes that a computed value is made of.
-struct Extent {
-    enum class Origin {
-        Here,      ///< where the field stands
-        Record,    ///< from byte 0 of the record
-        Companion, ///< the entry of the list's companion run with the same index
-    };
-
-    std::size_t byte;
-    std::size_t length = 1;
-    Origin origin = Origin::Here;
-};
-
-/// A 32-bit counter that counts with a weight.
-struct Counter {
-    std::size_t byte;
-    std::uint32_t weight;
-};
-
-/// Something holds only while a number lies from `least` to `most`.
-struct Condition {
-    Position position;
-    std::int64_t least = 0;
-    std::int64_t most = 0;
-    /// Shown for a field while it does not hold: a text, or a format of that number. Empty: the
-    /// field is then not shown at all.
-    std::string_view otherwise = {};
-    /// The subpacket in which the number stands, where the record is made of such.
-    std::optional<std::uint8_t> subpacket = std::nullopt;
-};
-
 /// One display key.
 struct FieldDescription {
     std::string key; ///< CDMA: the lookup name. Empty: the entry of a list is the value itself
@@ -66,25 +36,6 @@ struct FieldDescription {
     std::vector<Extent> read = {};      ///< what is computed of
     std::vector<Counter> counters = {}; ///< the counters among that, where there are some
     std::optional<Condition> condition = std::nullopt;
-};
-
-/// Entries one behind the other.
-struct EntryRun {
-    /// The whole run lies further behind by `bytes` for each unit of the number at `count`.
-    struct Move {
-        std::size_t bytes;
-        Position count;
-    };
-
-    EntryList::Layout layout = {};
-    std::optional<Move> move = std::nullopt;
-};
-
-/// The claimed length of a list against the record's, both cut to 8 bits: a list that seems too
-/// long is not shown. `otherLength` bytes for each unit at `otherCount` belong to another list.
-struct SizeCheck {
-    Position otherCount;
-    std::size_t otherLength;
 };
 
 /// Repeated entries.
@@ -121,14 +72,8 @@ struct ListDescription {
 };
 
 /// Of which part of a property list the fields of a record are.
-struct ListPart {
-    enum class Kind {
-        Keys,        ///< the list itself, a dictionary; its values are shown as they come
-        Elements,    ///< each element of the list, an array, is an entry, as it comes
-        FirstCell,   ///< of an array of cells the first one that is looked for
-        EachCell,    ///< each of them; of a key that several have, the last value stays
-        CellEntries, ///< each of them is an entry of the section's list
-    };
+struct ListPartDescription {
+    using Kind = ListPart::Kind;
 
     Kind kind;
     // Which cells are looked for: the telephony service's constants.
@@ -157,14 +102,16 @@ struct CodeDescription {
     std::vector<ListDescription> lists = {};
     std::vector<SubpacketDescription> subpackets = {};
 
-    std::optional<ListPart> listPart = std::nullopt; ///< of a record that is a property list
-    std::string_view note = {};                      ///< what else the record does: whole sentences
+    std::optional<ListPartDescription> listPart =
+        std::nullopt;           ///< of a record that is a property list
+    std::string_view note = {}; ///< what else the record does: whole sentences
 };
 
 using RecordDescription = std::vector<CodeDescription>;
 
-/// The whole bytes that hold a position.
-Extent extentOf(const Position& position, Extent::Origin origin = Extent::Origin::Here);
+/// What the layout says, code by code.
+CodeDescription describe(const CodeLayout& layout);
+RecordDescription describe(const RecordLayout& layout);
 
 FieldDescription describeField(const Field& field);
 std::vector<FieldDescription> describeFields(std::span<const Field> fields);

@@ -1,21 +1,13 @@
 #include "LogGenerator/UTRAN/RRC_State.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
-
 #include <array>
 
 namespace pallax {
 
 namespace {
 
-constexpr LogCode kStateLogCode = 0xD0E0;
-constexpr auto kLogCodes = std::to_array<LogCode>({kStateLogCode});
 constexpr std::size_t kExpectedLength = 15;
-
-constexpr std::size_t kVersionOffset = 13;
-constexpr std::uint8_t kKnownVersion = 1;
-constexpr std::size_t kModeOffset = 14;
+constexpr Position kMode = u8At(14);
 constexpr std::uint8_t kModeOfForeignVersion = 255;
 
 constexpr auto kModes = std::to_array<std::string_view>({
@@ -27,44 +19,54 @@ constexpr auto kModes = std::to_array<std::string_view>({
     "Cell URA PCH",
 });
 static_assert(kModes.size() == 6);
+
 constexpr std::string_view kUnknownMode = "Unknown RRC Mode";
-constexpr Conversion kModeLabel = Conversion::label(kModes, kUnknownMode);
+constexpr Condition kIsKnownVersion{u8At(13), 1, 1, kUnknownMode};
 constexpr std::string_view kStateKey = "State";
 
-std::uint8_t modeOf(const LogRecord& record) {
-    return record.u8(kVersionOffset) == kKnownVersion ? record.u8(kModeOffset)
-                                                      : kModeOfForeignVersion;
-}
+constexpr auto kFields = std::to_array<Field>({
+    Field{kStateKey, kMode, Conversion::label(kModes, kUnknownMode),
+          "State of the radio resource control."}
+        .when(kIsKnownVersion),
+});
 
-} // namespace
-
-std::span<const LogCode> RRC_State::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void RRC_State::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "RRC Info");
-    if (logCode != kStateLogCode) {
-        return;
-    }
+/// A short record is reported and read all the same.
+bool reportsShort(const CodeLayout& /*code*/, const LogRecord& record) {
     if (!record.has(kExpectedLength)) {
         systemLog(LogPriority::Warning, "LogCode_0xD0E0 is length is %ld expected size %ld",
                   record.length(), kExpectedLength);
     }
-    const std::uint8_t mode = modeOf(record);
-    const PropertyList label = kModeLabel.valueOf(mode);
-    show(kStateKey, label);
-    systemLog(LogPriority::Warning, "Display Dict = %@, rrc mode = %d %@", sectionRef(), mode,
-              label);
+    return true;
 }
 
-RecordDescription RRC_State::describe() const {
-    FieldDescription state = describeField({kStateKey, u8At(kModeOffset), kModeLabel});
-    state.condition = Condition{u8At(kVersionOffset), kKnownVersion, kKnownVersion, kUnknownMode};
-    CodeDescription code{kStateLogCode, LogRecord::kHeaderLength};
-    code.fields = {std::move(state)};
-    code.note = "A record of less than 15 bytes is reported and read all the same.";
-    return {std::move(code)};
+void logState(const LogRecord& record, const PropertyList& section) {
+    if (!SystemLog::isEnabled(LogPriority::Warning)) {
+        return;
+    }
+    const std::int64_t mode =
+        kIsKnownVersion.holdsIn(record) ? record.read(kMode) : kModeOfForeignVersion;
+    systemLog(LogPriority::Warning, "Display Dict = %@, rrc mode = %d %@", section, mode,
+              kFields.front().conversion.valueOf(mode).words());
 }
+
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = 0xD0E0,
+    .minimumLength = LogRecord::kHeaderLength,
+    .fields = kFields,
+    .note = "A record of less than 15 bytes is reported and read all the same.",
+    .accepts = reportsShort,
+    .logsSection = logState,
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "RRC Info",
+    .logLine = "RRC Info",
+    .codes = kCodes,
+    .reportsOtherCodes = false,
+};
+
+} // namespace
+
+RRC_State::RRC_State() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -13,12 +13,9 @@ namespace pallax {
 ///
 /// Only version 1 is understood; under any other the mode counts as 255. A record shorter than 15
 /// bytes is reported and read all the same. Other codes are ignored silently.
-class RRC_State final : public Base {
+class RRC_State final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "RRC Info"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    RecordDescription describe() const override;
+    RRC_State();
 };
 
 } // namespace pallax

@@ -82,7 +82,7 @@ void UTRANServingCellInfo::showServingCell(const PropertyList& cell) {
 RecordDescription UTRANServingCellInfo::describe() const {
     CodeDescription cell{kServingCellLogCode, kServingCellLength};
     cell.fields = describeFields(kFields);
-    CodeDescription monitored = describeCells(ListPart{ListPart::Kind::EachCell,
+    CodeDescription monitored = describeCells(ListPartDescription{ListPartDescription::Kind::EachCell,
                                                        {kHXCellMonitorRadioAccessTechnologyUTRAN2},
                                                        kHXCellMonitorCellTypeServing},
                                               kCellNumbers, {});

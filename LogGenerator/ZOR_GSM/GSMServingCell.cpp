@@ -77,7 +77,7 @@ void GSMServingCell::showServingCell(const LogRecord& record) {
 
 RecordDescription GSMServingCell::describe() const {
     RecordDescription description = describeGroups(kGroups);
-    description.push_back(describeCells(ListPart{ListPart::Kind::FirstCell,
+    description.push_back(describeCells(ListPartDescription{ListPartDescription::Kind::FirstCell,
                                                  {kHXCellMonitorRadioAccessTechnologyGSM},
                                                  kHXCellMonitorCellTypeServing},
                                         kCellNumbers, {}));

@@ -135,7 +135,7 @@ RecordDescription NeighboringCells::describe() const {
     bsics.lists.front().rememberedAs = "bsic";
     bsics.note = "Remembered for the lists to come; shows nothing itself.";
 
-    CodeDescription monitored = describeCells(ListPart{ListPart::Kind::CellEntries,
+    CodeDescription monitored = describeCells(ListPartDescription{ListPartDescription::Kind::CellEntries,
                                                        {kHXCellMonitorRadioAccessTechnologyGSM},
                                                        kHXCellMonitorCellTypeNeighbor},
                                               kCellNumbers, kCellLevels);

@@ -149,7 +149,7 @@ RecordDescription ServingPLMN::describe() const {
     CodeDescription selection{kRegistrationLogCode, kStateRecordLength};
     selection.fields = describeFields(kSelectionFields);
     return {std::move(network), std::move(selection),
-            describeCells(ListPart{ListPart::Kind::FirstCell,
+            describeCells(ListPartDescription{ListPartDescription::Kind::FirstCell,
                                    {kHXCellMonitorRadioAccessTechnologyGSM,
                                     kHXCellMonitorRadioAccessTechnologyUMTS},
                                    kHXCellMonitorCellTypeServing},

@@ -178,7 +178,7 @@ RecordDescription UMTSRRInfo::describe() const {
     CodeDescription ciphering{kCipheringLogCode, kCipheringRecordLength};
     ciphering.fields = describeFields(kCipheringFields);
     return {std::move(state), std::move(power), std::move(identity), std::move(ciphering),
-            describeCells(ListPart{ListPart::Kind::FirstCell,
+            describeCells(ListPartDescription{ListPartDescription::Kind::FirstCell,
                                    {kHXCellMonitorRadioAccessTechnologyUMTS},
                                    kHXCellMonitorCellTypeServing},
                           kCellNumbers, {})};

@@ -94,7 +94,7 @@ RecordDescription UMTSSet::describe() const {
     CodeDescription ranking{kRankingLogCode, kRankingRecordLength};
     ranking.lists = {describeList("", {kRankingEntriesStart, kEntryLength, kEntryLength},
                                   u8At(kCountOffset), kEntryFields)};
-    CodeDescription monitored = describeCells(ListPart{ListPart::Kind::CellEntries,
+    CodeDescription monitored = describeCells(ListPartDescription{ListPartDescription::Kind::CellEntries,
                                                        {kHXCellMonitorRadioAccessTechnologyUMTS},
                                                        kHXCellMonitorCellTypeNeighbor},
                                               kCellNumbers, kCellLevels);

@@ -24,35 +24,35 @@ TEST(Description, OfFieldsHasTheirKeysAndPlaces) {
     ASSERT_EQ(fields.size(), kFields.size());
     for (std::size_t index = 0; index < fields.size(); ++index) {
         EXPECT_EQ(fields[index].key, kFields[index].key);
-        EXPECT_EQ(fields[index].position->byte, kFields[index].position.byte);
-        EXPECT_EQ(fields[index].position->bit, kFields[index].position.bit);
-        EXPECT_EQ(fields[index].position->width, kFields[index].position.width);
-        EXPECT_EQ(fields[index].position->isSigned, kFields[index].position.isSigned);
+        EXPECT_EQ(fields[index].position->byte, kFields[index].position->byte);
+        EXPECT_EQ(fields[index].position->bit, kFields[index].position->bit);
+        EXPECT_EQ(fields[index].position->width, kFields[index].position->width);
+        EXPECT_EQ(fields[index].position->isSigned, kFields[index].position->isSigned);
     }
 }
 
 TEST(Description, OfAConversionIsTheConversionAsData) {
-    const ShownAs number = kFields[0].conversion.shownAs();
+    const ShownAs number = kFields[0].conversion;
     EXPECT_EQ(number.format, &kDecimal);
     EXPECT_EQ(number.factor, 1.0);
     EXPECT_EQ(number.offset, 0.0);
     EXPECT_EQ(number.exceptional, std::nullopt);
 
-    const ShownAs level = kFields[1].conversion.shownAs();
+    const ShownAs level = kFields[1].conversion;
     EXPECT_EQ(level.format, &kDbm);
     EXPECT_EQ(level.factor, 0.25);
     EXPECT_EQ(level.offset, -140.0);
     EXPECT_EQ(level.exceptional, 64);
     EXPECT_EQ(level.exceptionalText, "Not Present");
 
-    const ShownAs label = kFields[2].conversion.shownAs();
+    const ShownAs label = kFields[2].conversion;
     EXPECT_EQ(label.format, nullptr);
     EXPECT_EQ(label.labels.data(), kStates.data());
     EXPECT_EQ(label.labels.size(), 2U);
     EXPECT_EQ(label.beyond, "Lost");
     EXPECT_EQ(label.shift, 1);
 
-    const ShownAs flag = kFields[3].conversion.shownAs();
+    const ShownAs flag = kFields[3].conversion;
     EXPECT_EQ(flag.beyond, "Yes");
     EXPECT_EQ(flag.exceptional, 0);
     EXPECT_EQ(flag.exceptionalText, "No");

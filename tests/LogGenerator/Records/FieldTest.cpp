@@ -12,12 +12,18 @@ namespace {
 constexpr NumberFormat kLevel{"%4.2f dBm"};
 constexpr auto kLabels = std::to_array<std::string_view>({"Zero", "One", "Two"});
 
+PropertyList displayOf(const Conversion& conversion, std::int64_t raw) {
+    PropertyList value;
+    conversion.valueOf(raw).showIn(value);
+    return value;
+}
+
 std::string shown(const Conversion& conversion, std::int64_t raw) {
-    return conversion.valueOf(raw).string().value_or("(no text)");
+    return displayOf(conversion, raw).string().value_or("(no text)");
 }
 
 TEST(Conversion, NumbersKeepNumberAndFormat) {
-    const PropertyList value = Conversion::number(kDecimalDbm).valueOf(-80);
+    const PropertyList value = displayOf(Conversion::number(kDecimalDbm), -80);
     ASSERT_NE(value.displayNumber(), nullptr);
     EXPECT_EQ(value.displayNumber()->integer(), -80);
     EXPECT_EQ(value.string(), "-80 dBm");

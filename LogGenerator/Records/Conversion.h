@@ -1,0 +1,103 @@
+#pragma once
+
+#include "LogGenerator/Records/Formats.h"
+#include "LogGenerator/Records/SampleValue.h"
+
+#include <cstdint>
+#include <optional>
+#include <span>
+#include <string_view>
+
+namespace pallax {
+
+/// How a raw number becomes a display value: a label, or a number with its format. Formats and
+/// tables live as long as the program.
+struct Conversion {
+    /// Of a number: raw × factor + offset, computed in double precision and cut toward zero where
+    /// the format is an integer's. Null for a label.
+    const NumberFormat* format = nullptr;
+    double factor = 1.0;
+    double offset = 0.0;
+
+    /// labels[raw + shift]; with a shift other than 0 the index is cut to 8 bits, so that the byte
+    /// 255 finds the first entry at a shift of 1.
+    std::span<const std::string_view> labels = {};
+    std::uint8_t shift = 0;
+    /// Where the table has no entry: the low 32 bits of the raw number under `beyondFormat`, or
+    /// `beyond` where that is null.
+    std::string_view beyond = {};
+    const NumberFormat* beyondFormat = nullptr;
+
+    /// The one raw number that shows `exceptionalText` whatever the rest says.
+    std::optional<std::int64_t> exceptional = std::nullopt;
+    std::string_view exceptionalText = {};
+
+    static constexpr Conversion number(const NumberFormat& format = kDecimal, double factor = 1.0,
+                                       double offset = 0.0) {
+        Conversion result;
+        result.format = &format;
+        result.factor = factor;
+        result.offset = offset;
+        return result;
+    }
+    static Conversion number(const NumberFormat&& format, double = 1.0, double = 0.0) = delete;
+
+    static constexpr Conversion label(std::span<const std::string_view> labels,
+                                      std::string_view beyond = "Unknown", std::uint8_t shift = 0) {
+        Conversion result;
+        result.labels = labels;
+        result.beyond = beyond;
+        result.shift = shift;
+        return result;
+    }
+    static constexpr Conversion label(std::span<const std::string_view> labels,
+                                      const NumberFormat& beyond) {
+        Conversion result;
+        result.labels = labels;
+        result.beyondFormat = &beyond;
+        return result;
+    }
+    static Conversion label(std::span<const std::string_view> labels,
+                            const NumberFormat&& beyond) = delete;
+
+    /// `set` for every raw value but 0, which shows `clear`.
+    static constexpr Conversion flag(std::string_view set, std::string_view clear) {
+        Conversion result;
+        result.beyond = set;
+        result.exceptional = 0;
+        result.exceptionalText = clear;
+        return result;
+    }
+
+    /// This conversion for every raw value but `raw`, which shows `text` ("Not Present").
+    constexpr Conversion except(std::int64_t raw, std::string_view text) const {
+        Conversion result = *this;
+        result.exceptional = raw;
+        result.exceptionalText = text;
+        return result;
+    }
+
+    SampleValue valueOf(std::int64_t raw) const;
+};
+
+inline SampleValue Conversion::valueOf(std::int64_t raw) const {
+    if (exceptional && raw == *exceptional) {
+        return SampleValue::label(exceptionalText);
+    }
+    if (format != nullptr) {
+        const bool plain = factor == 1.0 && offset == 0.0;
+        return plain ? DisplayNumber(raw, *format)
+                     : DisplayNumber(static_cast<double>(raw) * factor + offset, *format);
+    }
+    const auto index = static_cast<std::uint64_t>(raw) + shift;
+    const std::size_t entry = shift == 0 ? index : static_cast<std::uint8_t>(index);
+    if (entry < labels.size()) {
+        return SampleValue::label(labels[entry]);
+    }
+    if (beyondFormat != nullptr) {
+        return DisplayNumber(std::int64_t{static_cast<std::int32_t>(raw)}, *beyondFormat);
+    }
+    return SampleValue::label(beyond);
+}
+
+} // namespace pallax

@@ -1,0 +1,245 @@
+#pragma once
+
+#include "LogGenerator/Records/Layout.h"
+#include "LogGenerator/Records/Sample.h"
+#include "plist/PropertyList.h"
+#include "text/Format.h"
+
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+
+namespace pallax {
+
+/// Reads a record as its layout says, and gives what it finds to a sink: the one loop over log
+/// records. A template for the display's sake, which takes a sample several times as fast when the
+/// compiler sees both sides.
+template <class Sink>
+class LayoutReader {
+public:
+    /// Rows are numbered from `first` on. All of it outlives the reader.
+    LayoutReader(Sink& sink, RecordMemory& memory, FieldId first)
+        : _sink(sink), _memory(memory), _next(first) {}
+
+    /// For a record that the layout accepts.
+    void read(const CodeLayout& code, const LogRecord& record) {
+        _place.record = record;
+        for (const std::string_view key : code.removes) {
+            _sink.keyRemoved(key);
+        }
+        if (code.emptiesList) {
+            _sink.beginList({});
+            _sink.endList();
+        }
+        if (code.listPart != nullptr) {
+            return readListPart(code);
+        }
+        readIn(record, code.fields, code.lists);
+    }
+
+    /// The fields and lists of a part of the record, such as a subpacket.
+    void readIn(const LogRecord& place, std::span<const Field> fields,
+                std::span<const ListLayout> lists) {
+        readFields(place, fields);
+        for (const ListLayout& list : lists) {
+            readList(list, place);
+        }
+    }
+
+private:
+    void give(const Field& field, FieldId id, std::optional<std::int64_t> raw,
+              const SampleValue& value) {
+        _sink.sample({id, field, raw, value});
+    }
+
+    void readFields(const LogRecord& place, std::span<const Field> fields) {
+        FieldId id = _next;
+        for (const Field& field : fields) {
+            if (field.condition == nullptr && field.computation == nullptr) {
+                const std::int64_t raw = place.read(*field.position);
+                give(field, id, raw, field.conversion.valueOf(raw));
+            } else {
+                readSpecial(field, id, place);
+            }
+            ++id;
+        }
+        _next = id;
+    }
+
+    void readSpecial(const Field& field, FieldId id, const LogRecord& place) {
+        if (field.condition != nullptr) {
+            const std::int64_t number = place.read(field.condition->position);
+            if (!field.condition->holdsFor(number)) {
+                return giveOtherwise(field, id, number);
+            }
+        }
+        if (field.computation == nullptr) {
+            const std::int64_t raw = place.read(*field.position);
+            return give(field, id, raw, field.conversion.valueOf(raw));
+        }
+        _place.here = place;
+        _place.memory = &_memory;
+        const PropertyList value = field.computation->compute(_place);
+        if (const DisplayNumber* number = value.displayNumber()) {
+            give(field, id, std::nullopt, SampleValue(*number));
+        } else if (!value.isNull()) {
+            give(field, id, std::nullopt, SampleValue::object(value));
+        }
+    }
+
+    void giveOtherwise(const Field& field, FieldId id, std::int64_t number) {
+        const std::string_view otherwise = field.condition->otherwise;
+        if (otherwise.find('%') != std::string_view::npos) {
+            // A text, for the number in it is not that of the row.
+            const std::string text = formatText(otherwise, {number});
+            give(field, id, std::nullopt, SampleValue::text(text));
+        } else if (!otherwise.empty()) {
+            give(field, id, std::nullopt, SampleValue::label(otherwise));
+        }
+    }
+
+    void readList(const ListLayout& list, const LogRecord& place) {
+        const FieldId first = _next;
+        const std::size_t count = list.countIn(place);
+        const bool isKept = list.staysWithoutEntries && count == 0;
+        if (!isKept && (list.isShown || Sink::kTakesHidden)) {
+            readEntries(list, place, first);
+        }
+        _next = first + static_cast<FieldId>(list.fields.size() + rowCount(list.lists));
+    }
+
+    void readEntries(const ListLayout& list, const LogRecord& place, FieldId first) {
+        const EntryList entries = list.entriesIn(place);
+        const std::size_t whole = list.passesSizeCheck(place) ? entries.wholeCount() : 0;
+        const std::optional<EntryList> companions =
+            list.companion
+                ? std::optional<EntryList>(std::in_place, place, list.companion->layoutIn(place),
+                                           entries.count())
+                : std::nullopt;
+        _sink.beginList({list.key, &list, whole});
+        for (std::size_t index = 0; index < whole; ++index) {
+            const LogRecord entry = entries.at(index);
+            if (list.only != nullptr && !list.only->holdsIn(entry)) {
+                continue;
+            }
+            if (companions) {
+                if (!companions->isWhole(index)) {
+                    break; // it is part of the entry
+                }
+                _place.companion = companions->at(index);
+            }
+            if (!holdsItsFields(list, entry)) {
+                break;
+            }
+            _next = first;
+            _sink.beginEntry(index, list.entryName ? entry.read(*list.entryName) : 0);
+            readIn(entry, list.fields, list.lists);
+            _sink.endEntry();
+        }
+        _sink.endList();
+    }
+
+    /// An entry may be longer where a condition holds.
+    static bool holdsItsFields(const ListLayout& list, const LogRecord& entry) {
+        for (const Field& field : list.fields) {
+            if (field.condition == nullptr || !field.position) {
+                continue;
+            }
+            const Extent extent = extentOf(*field.position);
+            if (!entry.has(extent.byte + extent.length) && field.condition->holdsIn(entry)) {
+                return false;
+            }
+        }
+        return true;
+    }
+
+    void readListPart(const CodeLayout& code) {
+        const ListPart& part = *code.listPart;
+        const bool isEntries = part.isEntries();
+        const std::optional<PropertyList> list = part.parse(_place.record);
+        if (!list) {
+            if (part.kind == ListPart::Kind::CellEntries) {
+                _sink.beginList({});
+                _sink.endList();
+            }
+            return;
+        }
+        if (part.kind == ListPart::Kind::Keys) {
+            return readKeys(list->dictionary(), code.fields);
+        }
+        const ArrayRef elements = list->array();
+        if (elements == nullptr && part.kind == ListPart::Kind::Elements) {
+            return;
+        }
+        if (isEntries) {
+            _sink.beginList({{}, nullptr, elements != nullptr ? elements->size() : 0});
+        }
+        if (elements != nullptr) {
+            readElements(part, *elements, code.fields);
+        }
+        if (isEntries) {
+            _sink.endList();
+        }
+    }
+
+    void readElements(const ListPart& part, const Array& elements, std::span<const Field> fields) {
+        const FieldId first = _next;
+        std::size_t index = 0;
+        for (const PropertyList& element : elements) {
+            if (part.kind == ListPart::Kind::Elements) {
+                _sink.beginEntry(index++, 0);
+                give(fields.front(), first, std::nullopt, SampleValue::object(element));
+                _sink.endEntry();
+            } else if (part.looksFor(element)) {
+                if (part.isEntries()) {
+                    _sink.beginEntry(index++, 0);
+                }
+                readCell(*element.dictionary(), fields);
+                if (part.isEntries()) {
+                    _sink.endEntry();
+                } else if (part.kind == ListPart::Kind::FirstCell) {
+                    return;
+                }
+            }
+        }
+    }
+
+    void readKeys(const DictionaryRef& keys, std::span<const Field> fields) {
+        FieldId id = _next;
+        for (const Field& field : fields) {
+            const PropertyList* value = keys != nullptr ? keys->find(field.listKey) : nullptr;
+            if (value != nullptr) {
+                give(field, id, std::nullopt, SampleValue::object(*value));
+            }
+            ++id;
+        }
+    }
+
+    void readCell(const Dictionary& cell, std::span<const Field> fields) {
+        FieldId id = _next;
+        for (const Field& field : fields) {
+            const PropertyList* value = cell.find(field.listKey);
+            const auto number = value != nullptr ? value->int32() : std::nullopt;
+            if (number) {
+                const std::int64_t raw = lowBits(*number, field.listBits);
+                give(field, id, raw, field.conversion.valueOf(raw));
+            } else if (!field.failure.empty()) {
+                systemLog(LogPriority::Error, "%s", field.failure);
+            }
+            ++id;
+        }
+    }
+
+    static std::int64_t lowBits(std::int32_t number, unsigned bits) {
+        constexpr unsigned kLevelBits = 16;
+        return bits == kLevelBits ? static_cast<std::int16_t>(number) : number;
+    }
+
+    Sink& _sink;
+    RecordMemory& _memory;
+    FieldId _next;
+    Place _place;
+};
+
+} // namespace pallax

@@ -1,0 +1,147 @@
+#include "LogGenerator/Records/LayoutRecord.h"
+
+#include "LogGenerator/Records/Description.h"
+#include "platform/SystemLog.h"
+
+#include <algorithm>
+
+namespace pallax {
+
+namespace {
+
+/// One pass for both, over a record that must be read once. What is kept from the display goes to
+/// the other sink alone.
+class DisplayAndSink final : public SampleSink {
+public:
+    DisplayAndSink(SectionDisplay& display, SampleSink& sink) : _display(display), _sink(sink) {}
+
+    void sample(const Sample& sample) override {
+        each([&](SampleSink& to) { to.sample(sample); });
+    }
+    void keyRemoved(std::string_view key) override {
+        each([&](SampleSink& to) { to.keyRemoved(key); });
+    }
+    void beginList(const SampleList& list) override {
+        _isHidden = list.layout != nullptr && !list.layout->isShown;
+        each([&](SampleSink& to) { to.beginList(list); });
+    }
+    void endList() override {
+        each([](SampleSink& to) { to.endList(); });
+        _isHidden = false;
+    }
+    void beginEntry(std::size_t index, std::int64_t name) override {
+        each([&](SampleSink& to) { to.beginEntry(index, name); });
+    }
+    void endEntry() override {
+        each([](SampleSink& to) { to.endEntry(); });
+    }
+
+private:
+    template <class Give>
+    void each(const Give& give) {
+        if (!_isHidden) {
+            give(_display);
+        }
+        give(_sink);
+    }
+
+    SectionDisplay& _display;
+    SampleSink& _sink;
+    bool _isHidden = false;
+};
+
+bool checksSize(const CodeLayout& code) {
+    return std::any_of(code.lists.begin(), code.lists.end(),
+                       [](const ListLayout& list) { return list.sizeCheck.has_value(); });
+}
+
+void logUnexpectedSizes(const CodeLayout& code, const LogRecord& record) {
+    for (const ListLayout& list : code.lists) {
+        if (!list.passesSizeCheck(record)) {
+            const auto [expected, actual] = list.sizesIn(record);
+            systemLog(LogPriority::Error, "Unexpected log packet bytes size: expected=%d actual=%d",
+                      expected, actual);
+        }
+    }
+}
+
+} // namespace
+
+LayoutRecord::LayoutRecord(const RecordLayout& layout) : _layout(layout), _display(_memory) {
+    FieldId row = 0;
+    for (const CodeLayout& code : layout.codes) {
+        _codes.push_back({&code, row, pallax::isReadLate(code), checksSize(code)});
+        _logCodes.push_back(code.logCode);
+        row += static_cast<FieldId>(rowCount(code));
+    }
+}
+
+void LayoutRecord::updateSectionRef(PropertyList section) {
+    _display.bringUpToDate(); // what was kept is for the section before
+    Base::updateSectionRef(std::move(section));
+    _display.setSection(sectionRef());
+}
+
+RecordDescription LayoutRecord::describe() const {
+    return pallax::describe(_layout);
+}
+
+void LayoutRecord::setSink(SampleSink* sink, FieldId first) {
+    _sink = sink;
+    _firstRow = first;
+}
+
+const LayoutRecord::Code* LayoutRecord::codeOf(LogCode logCode) const {
+    const auto found = std::find_if(_codes.begin(), _codes.end(), [logCode](const Code& each) {
+        return each.layout->logCode == logCode;
+    });
+    return found != _codes.end() ? &*found : nullptr;
+}
+
+void LayoutRecord::updateWithData(const LogRecord& record, LogCode logCode) {
+    systemLog(_layout.priority, "%s", _layout.logLine);
+    const Code* code = codeOf(logCode);
+    if (code == nullptr) {
+        if (_layout.reportsOtherCodes) {
+            logUnknownLogCode(logCode);
+        }
+        return;
+    }
+    const CodeLayout& layout = *code->layout;
+    const bool accepted =
+        layout.accepts != nullptr ? layout.accepts(layout, record) : isAllowed(layout, record);
+    if (!accepted) {
+        return;
+    }
+    if (layout.logs != nullptr) {
+        layout.logs(layout, record);
+    }
+    if (code->checksSize) {
+        logUnexpectedSizes(layout, record);
+    }
+    if (!code->isReadLate) {
+        return readNow(*code, record);
+    }
+    if (_sink != nullptr) {
+        LayoutReader(*_sink, _memory, _firstRow + code->firstRow).read(layout, record);
+    }
+    _display.keep(layout, record);
+}
+
+void LayoutRecord::readNow(const Code& code, const LogRecord& record) {
+    const CodeLayout& layout = *code.layout;
+    _display.bringUpToDate(); // with what is remembered until now
+    remember(layout, record, _memory);
+    const FieldId first = _firstRow + code.firstRow;
+    if (_sink == nullptr) {
+        LayoutReader(_display, _memory, first).read(layout, record);
+    } else {
+        DisplayAndSink both(_display, *_sink);
+        LayoutReader<SampleSink>(both, _memory, first).read(layout, record);
+    }
+    if (layout.logsSection != nullptr) {
+        layout.logsSection(record, sectionRef());
+    }
+}
+
+} // namespace pallax

@@ -1,0 +1,60 @@
+#pragma once
+
+#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/Layout.h"
+#include "LogGenerator/Records/SectionDisplay.h"
+
+#include <vector>
+
+namespace pallax {
+
+/// A record class whose layout is its decoder.
+class LayoutRecord : public Base {
+public:
+    /// `layout` lives as long as the program.
+    explicit LayoutRecord(const RecordLayout& layout);
+
+    const RecordLayout& layout() const { return _layout; }
+    std::string_view getSectionName() const override { return _layout.section; }
+    std::span<const LogCode> getLogCodeArray() const override { return _logCodes; }
+    void updateSectionRef(PropertyList section) override;
+    /// Logs what the record tells, and gives its samples to the sink at once. The display may read
+    /// it later.
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
+
+    void receive(const LogRecord& record, LogCode logCode) override {
+        updateWithData(record, logCode);
+    }
+    void catchUp() override { _display.bringUpToDate(); }
+    SectionKind sectionKind() const override { return _layout.kind; }
+    RecordDescription describe() const override;
+
+    /// What shows the section; behind the latest record until it is brought up to date.
+    SectionDisplay& display() { return _display; }
+
+    /// Gives the samples of later records to `sink`, too; this record's rows are numbered from
+    /// `first` on. Null: to the display alone. The sink outlives the record, or is taken away.
+    void setSink(SampleSink* sink, FieldId first);
+
+private:
+    /// What is worked out once of a code's layout.
+    struct Code {
+        const CodeLayout* layout;
+        FieldId firstRow; ///< from the record's first
+        bool isReadLate;
+        bool checksSize;
+    };
+
+    const Code* codeOf(LogCode logCode) const;
+    void readNow(const Code& code, const LogRecord& record);
+
+    const RecordLayout& _layout;
+    std::vector<Code> _codes;
+    std::vector<LogCode> _logCodes;
+    RecordMemory _memory;
+    SectionDisplay _display;
+    SampleSink* _sink = nullptr;
+    FieldId _firstRow = 0;
+};
+
+} // namespace pallax

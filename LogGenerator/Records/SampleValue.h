@@ -1,0 +1,60 @@
+#pragma once
+
+#include "plist/PropertyList.h"
+#include "text/NumberFormat.h"
+
+#include <string_view>
+#include <variant>
+
+namespace pallax {
+
+/// What a field shows: a number with its format, a label of a table, a text, or an object of a
+/// property list. Texts and objects that are not from a table are valid until the sample is taken.
+class SampleValue {
+public:
+    SampleValue(const DisplayNumber& number) : _value(number) {}
+    /// A text with static storage duration.
+    static SampleValue label(std::string_view text) { return SampleValue(Value(Label{text})); }
+    /// A text that is made for this sample.
+    static SampleValue text(std::string_view text) { return SampleValue(Value(text)); }
+    static SampleValue object(const PropertyList& object) { return SampleValue(Value(&object)); }
+
+    /// Null for everything else, as are those below.
+    const DisplayNumber* number() const { return std::get_if<DisplayNumber>(&_value); }
+    const PropertyList* object() const {
+        const auto* object = std::get_if<const PropertyList*>(&_value);
+        return object != nullptr ? *object : nullptr;
+    }
+    /// The text of a label or text; empty for everything else.
+    std::string_view words() const {
+        if (const auto* label = std::get_if<Label>(&_value)) {
+            return label->text;
+        }
+        const auto* text = std::get_if<std::string_view>(&_value);
+        return text != nullptr ? *text : std::string_view();
+    }
+
+    /// Makes `target` a display value of it.
+    void showIn(PropertyList& target) const {
+        if (const DisplayNumber* display = number()) {
+            target.assign(*display);
+        } else if (const auto* label = std::get_if<Label>(&_value)) {
+            target.assign(Text::fixed(label->text));
+        } else if (const PropertyList* whole = object()) {
+            target = *whole;
+        } else {
+            target.assign(Text(words()));
+        }
+    }
+
+private:
+    struct Label {
+        std::string_view text;
+    };
+    using Value = std::variant<DisplayNumber, Label, std::string_view, const PropertyList*>;
+    explicit SampleValue(Value value) : _value(value) {}
+
+    Value _value;
+};
+
+} // namespace pallax
