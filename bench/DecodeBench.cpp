@@ -7,8 +7,8 @@
 
 #include "LogGenerator/LogPacket.h"
 #include "LogGenerator/Technologies/Technologies.h"
-#include "cli/DecodeCommand.h"
-#include "cli/DroppedNotices.h"
+#include "decoding/DecodeCommand.h"
+#include "decoding/DroppedNotices.h"
 #include "host/BuildBundle.h"
 #include "host/DirectoryResources.h"
 

@@ -4,6 +4,7 @@
 #include "cli/HelpFormatter.h"
 #include "cli/ManualPage.h"
 #include "cli/OptionParts.h"
+#include "cli/SimulateOptions.h"
 #include "cli/Suggestion.h"
 #include "host/RecordingFile.h"
 

@@ -1,7 +1,9 @@
 #include "cli/Options.h"
 
+#include "cli/Amounts.h"
 #include "cli/CommandLine.h"
 #include "cli/OptionParts.h"
+#include "cli/SimulateOptions.h"
 
 #include <CLI/CLI.hpp>
 

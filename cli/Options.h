@@ -1,13 +1,12 @@
 #pragma once
 
-#include "cli/DecodeCommand.h"
-#include "cli/ExitStatus.h"
-#include "cli/RecordOptions.h"
-#include "cli/SimulateOptions.h"
+#include "browsing/BrowseOptions.h"
+#include "console/ExitStatus.h"
+#include "decoding/DecodeCommand.h"
+#include "recording/RecordOptions.h"
+#include "recording/Simulate.h"
 #include "telephony/Service.h"
-#include "ui/terminal/CursesTerminal.h"
 
-#include <optional>
 #include <string>
 #include <variant>
 #include <vector>
@@ -17,17 +16,6 @@ class App;
 } // namespace CLI
 
 namespace pallax {
-
-struct BrowseOptions {
-    std::optional<std::string> recording;        ///< without one, the live modem
-    std::optional<SimulationOptions> simulation; ///< or a simulated modem
-    PlayOptions play;
-    bool print = false;
-    terminal::ColorUse color = terminal::ColorUse::Auto;
-    bool mouse = true;
-    bool keepGoing = false;
-    std::optional<int> logLevel; ///< system-log lines up to it go to standard error
-};
 
 /// The command line asks for no more than a text, or cannot be understood.
 struct ParseEnd {

@@ -1,6 +1,7 @@
 #include "cli/ServiceRequest.h"
 
 #include "cli/OptionParts.h"
+#include "cli/SimulateOptions.h"
 
 namespace pallax {
 

@@ -1,10 +1,10 @@
 #pragma once
 
+#include "recording/Simulate.h"
 #include "simulator/Simulation.h"
 #include "telephony/PacketPlayer.h"
 
 #include <optional>
-#include <string>
 
 namespace CLI {
 class App;
@@ -12,12 +12,6 @@ class Option;
 } // namespace CLI
 
 namespace pallax {
-
-/// `pallax simulate`: a simulation, which has a duration, as a recording.
-struct SimulateOptions {
-    SimulationOptions simulation;
-    std::string file; ///< "-" is standard output
-};
 
 /// The technology that `demo` shows when none is named.
 const RecordedTechnology* usualSimulatedTechnology();

@@ -1,8 +1,11 @@
-#include "cli/FatalRecord.h"
-#include "cli/Output.h"
-#include "cli/Programs.h"
+#include "browsing/Browse.h"
+#include "cli/Options.h"
+#include "console/Output.h"
+#include "decoding/Decode.h"
+#include "decoding/FatalRecord.h"
 #include "host/Complaint.h"
 #include "host/StandardDescriptors.h"
+#include "recording/Record.h"
 #include "telephony/ChildService.h"
 
 #include <csignal>

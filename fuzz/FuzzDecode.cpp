@@ -3,8 +3,8 @@
 // 16 bits each, little-endian, then their bytes.
 
 #include "LogGenerator/Technologies/Technologies.h"
-#include "cli/DroppedNotices.h"
-#include "cli/RecordingDecoder.h"
+#include "decoding/DroppedNotices.h"
+#include "decoding/RecordingDecoder.h"
 #include "host/DirectoryResources.h"
 #include "platform/Bundle.h"
 #include "platform/Resources.h"

@@ -1,7 +1,7 @@
 // The settings file: any text is taken or refused with one sentence that names file and line, and
 // what is taken holds no line's end.
 
-#include "cli/Settings.h"
+#include "link/Settings.h"
 
 #include <algorithm>
 #include <cstdint>

@@ -1,4 +1,4 @@
-#include "cli/BrowseLink.h"
+#include "link/BrowseLink.h"
 #include "tests/cli/EndToEnd.h"
 #include "tests/cli/FaultyService.h"
 #include "tests/doubles/FakeStandardOutput.h"

@@ -1,4 +1,4 @@
-#include "cli/Settings.h"
+#include "link/Settings.h"
 #include "tests/doubles/Files.h"
 
 #include <gtest/gtest.h>

@@ -1,0 +1,95 @@
+#include "browsing/PrintBrowser.h"
+
+#include "app/HomeScreenPreference.h"
+#include "console/Output.h"
+#include "decoding/StampSentence.h"
+#include "host/Complaint.h"
+#include "host/FilePreferences.h"
+#include "link/WaitNotice.h"
+#include "text/Format.h"
+
+#include <chrono>
+#include <csignal>
+#include <utility>
+
+namespace pallax {
+
+void PrintBrowser::Notices::printLine(std::string_view line) {
+    _output.text() += line;
+    _output.text() += '\n';
+}
+
+PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
+                           ChildService* child, AfterReconnect afterReconnect, Output& output,
+                           std::string source)
+    : _source(std::move(source)), _afterReconnect(afterReconnect), _notices(output),
+      _link(std::move(directory), onFatalRecord, child, _notices),
+      _printer(output, _link.clock(), [this] { return _model->topLevelNodes(); }),
+      _model(std::make_unique<PallaxModel>(_link.modelPlatform(*this))) {}
+
+PrintBrowser::~PrintBrowser() {
+    FilePreferences preferences(FilePreferences::userFolder());
+    setGSMRSSI(preferences, false);
+}
+
+bool PrintBrowser::run() {
+    AsioMainQueue& queue = _link.queue();
+    queue.onSignal({SIGINT, SIGTERM, SIGHUP, SIGQUIT}, [&queue](int /*signal*/) { queue.stop(); });
+    _link.clock().onStampRemark([this](std::uint32_t packet, const StampRemark& remark) {
+        complain(stampSentence(_source, packet, remark));
+    });
+    if (_link.hasChild()) {
+        // The last tick has posted its view update before; that is to come first.
+        _link.clock().onEnd([&queue] { queue.async([&queue] { queue.stop(); }); });
+    }
+    queue.async([this] { start(); });
+    const auto looks = queue.scheduleRepeating(BrowseLink::kLookInterval, [this] { look(); });
+    const WaitNotice notice({queue, [this] { return _model->isConnected(); },
+                             [this] { return _link.obstacle(); }, complainOfWaiting});
+    queue.run();
+    return !_childLost;
+}
+
+void PrintBrowser::start() {
+    _model->startMonitor();
+    _printer.showConnection(_model->isConnected());
+}
+
+void PrintBrowser::updateViewControllerFromModel() {
+    _displayAge.shown(_link.clock().now());
+    _printer.updateViewControllerFromModel();
+}
+
+void PrintBrowser::generatorChosen(const std::string& /*technology*/, bool keepsDisplay) {
+    _displayAge.generatorChosen(keepsDisplay, _link.clock().now());
+    if (!keepsDisplay) {
+        return;
+    }
+    if (_afterReconnect == AfterReconnect::Keep) {
+        complain(formatText("The link was restarted: values from before %@ stay on display "
+                            "(after-reconnect = fresh in pallax.conf starts afresh).",
+                            {dateText(dateOf(*_displayAge.left()))}));
+        return;
+    }
+    complain("The link was restarted: the display starts afresh.");
+    _link.queue().async([this] { // not from within the model
+        _model.reset();          // the name of its port is free for the next one's
+        _model = std::make_unique<PallaxModel>(_link.modelPlatform(*this));
+        _displayAge = {};
+        _printer.startAfresh();
+        start();
+    });
+}
+
+void PrintBrowser::look() {
+    _printer.showConnection(_model->isConnected());
+    if (_link.childHasEnded()) {
+        // A signal to the whole process group may be on its way to us too.
+        _link.queue().after(BrowseLink::kLookInterval, [this] {
+            _childLost = true;
+            _link.queue().stop();
+        });
+    }
+}
+
+} // namespace pallax

@@ -1,0 +1,58 @@
+#pragma once
+
+#include "browsing/TreePrinter.h"
+#include "link/BrowseLink.h"
+#include "link/Settings.h"
+#include "monitor/DisplayAge.h"
+#include "monitor/PallaxModel.h"
+#include "platform/StandardOutput.h"
+
+#include <memory>
+#include <string>
+
+namespace pallax {
+
+class Output;
+
+/// Browses without a terminal: a model, and the printer that shows it.
+class PrintBrowser final : private ModelObserver {
+public:
+    /// `source` names what is browsed, for sentences about it.
+    PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
+                 AfterReconnect afterReconnect, Output& output, std::string source);
+    /// Whatever ended it: switches the home-screen preference off, as the application does.
+    ~PrintBrowser() override;
+    PrintBrowser(const PrintBrowser&) = delete;
+    PrintBrowser& operator=(const PrintBrowser&) = delete;
+
+    /// Browses until a signal, or with a child until its recording has ended. False when the
+    /// child ended before.
+    bool run();
+
+private:
+    /// What generators print when they end goes where the tree goes.
+    class Notices final : public StandardOutput {
+    public:
+        explicit Notices(Output& output) : _output(output) {}
+        void printLine(std::string_view line) override;
+
+    private:
+        Output& _output;
+    };
+
+    void updateViewControllerFromModel() override;
+    void generatorChosen(const std::string& technology, bool keepsDisplay) override;
+    void start();
+    void look();
+
+    std::string _source;
+    AfterReconnect _afterReconnect;
+    DisplayAge _displayAge;
+    bool _childLost = false;
+    Notices _notices;
+    BrowseLink _link;
+    TreePrinter _printer;
+    std::unique_ptr<PallaxModel> _model;
+};
+
+} // namespace pallax

@@ -1,0 +1,59 @@
+#pragma once
+
+#include "app/tree/PallaxModelNode.h"
+#include "console/Output.h"
+#include "monitor/PallaxModel.h"
+
+#include <cstddef>
+#include <functional>
+#include <string>
+#include <unordered_map>
+
+namespace pallax {
+
+class Clock;
+
+/// Browsing without a terminal: at each display tick that saw new data the whole tree as text,
+/// one leaf a line, the changed ones marked.
+///
+///     == 2023-11-14 22:13:22 +0000
+///     Serving Cell Measurements
+///       E-ARFCN: 1850
+///     * Measured RSRP: -94.75 dBm
+///
+/// The mark takes the place of the first two blanks, so columns stay. A leaf that was not there
+/// before is a changed one; in the first block nothing is marked.
+class TreePrinter final : public ModelObserver {
+public:
+    /// Gives the root of the display tree, or null.
+    using Nodes = std::function<NodeRef()>;
+
+    TreePrinter(Output& output, const Clock& clock, Nodes nodes)
+        : _output(output), _clock(clock), _nodes(std::move(nodes)) {}
+
+    void updateViewControllerFromModel() override;
+    /// The next block is a first one.
+    void startAfresh() {
+        _hasPrinted = false;
+        _values.clear();
+    }
+    /// To be told now and then: prints "Connecting..." once each time there is no connection.
+    void showConnection(bool isConnected);
+
+private:
+    using Values = std::unordered_map<std::string, std::string>;
+
+    void printChildren(const PallaxModelNode& node, const std::string& path, std::size_t depth,
+                       Values& values);
+    void printLeaf(const PallaxModelNode& leaf, std::string path, std::size_t depth,
+                   Values& values);
+
+    Output& _output;
+    const Clock& _clock;
+    Nodes _nodes;
+    bool _toldConnecting = false;
+    bool _hasPrinted = false;
+    Values _values; // of the previous block, by path
+};
+
+} // namespace pallax

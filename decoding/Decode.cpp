@@ -1,0 +1,227 @@
+#include "decoding/Decode.h"
+
+#include "LogGenerator/Technologies/Technologies.h"
+#include "console/ScopedLog.h"
+#include "decoding/DecodeCommand.h"
+#include "decoding/DecodeProgress.h"
+#include "decoding/DroppedNotices.h"
+#include "decoding/OrderedWorkers.h"
+#include "decoding/RequiredTemplates.h"
+#include "host/BuildBundle.h"
+#include "host/Complaint.h"
+#include "host/LogSinks.h"
+#include "host/MonotonicClock.h"
+#include "host/RecordingFile.h"
+#include "text/Format.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <optional>
+#include <string>
+#include <sys/stat.h>
+#include <thread>
+#include <unistd.h>
+
+namespace pallax {
+
+namespace {
+
+/// Nothing for what cannot be looked at; its reader has the sentence. "-" is standard input.
+std::optional<struct stat> fileStatus(const std::string& recording) {
+    struct stat status {};
+    const int result =
+        recording == "-" ? ::fstat(STDIN_FILENO, &status) : ::stat(recording.c_str(), &status);
+    return result == 0 ? std::optional(status) : std::nullopt;
+}
+
+/// The recording that is the same file, as the user named it.
+std::optional<std::string> recordingIn(const struct stat& file, const DecodeOptions& options) {
+    for (const std::string& recording : options.recordings) {
+        const auto status = fileStatus(recording);
+        if (status && S_ISREG(file.st_mode) && status->st_dev == file.st_dev &&
+            status->st_ino == file.st_ino) {
+            return recording == "-" ? "of standard input" : recording;
+        }
+    }
+    return std::nullopt;
+}
+
+/// Why one of the recordings would be written over; nothing when none would.
+std::optional<std::string> lossOfInput(const DecodeOptions& options) {
+    struct stat file {};
+    if (::fstat(STDOUT_FILENO, &file) == 0) {
+        if (const auto recording = recordingIn(file, options)) {
+            return formatText("Standard output would go into the recording %@.", {*recording});
+        }
+    }
+    if (options.systemLog && ::stat(options.systemLog->c_str(), &file) == 0) {
+        if (const auto recording = recordingIn(file, options)) {
+            return formatText("The system log %@ would replace the recording %@.",
+                              {*options.systemLog, *recording});
+        }
+    }
+    return std::nullopt;
+}
+
+/// Gives the command, wired to this machine, to `use`.
+template <class Use>
+ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, const Use& use) {
+    const RequiredTemplates resources(DirectoryResources::programFolder());
+    const BuildBundle bundle;
+    DroppedNotices notices;
+    const auto report = [&progress](std::string_view sentence) {
+        progress.wipe();
+        complain(sentence);
+    };
+    const auto open = [&report](const std::string& path) {
+        return Recording::openInput({path, {}, report});
+    };
+    DecodeCommand command(options, {resources, bundle, notices, technologies()}, open, report,
+                          progress.isShown() ? &progress : nullptr);
+    return use(command);
+}
+
+/// Whole lines at a time, which may come on the same terminal as the progress.
+Output::Write standardOutput(DecodeProgress& progress) {
+    return [&progress,
+            write = writeToDescriptor(STDOUT_FILENO, "Standard output")](std::string_view block) {
+        progress.wipe();
+        write(block);
+    };
+}
+
+ExitStatus decodeOneByOne(const DecodeOptions& options, DecodeProgress& progress) {
+    Output output(standardOutput(progress));
+    return withCommand(options, progress,
+                       [&](DecodeCommand& command) { return command.run(output); });
+}
+
+/// A worker's piece of the work, into its files.
+ExitStatus decodeInWorker(const DecodeOptions& options, DecodeProgress& progress,
+                          std::size_t recording, const WorkerFiles& files) {
+    progress.becomeWorker();
+    const auto decode = [&] {
+        Output output(writeToDescriptor(STDOUT_FILENO, "A temporary file"));
+        return withCommand(options, progress, [&](DecodeCommand& command) {
+            return command.runOne(recording, output);
+        });
+    };
+    if (!options.systemLog) {
+        return decode();
+    }
+    const auto sink = FileSink::onto(files.systemLog.number());
+    if (!sink) {
+        complain(sink.error().sentence);
+        return kExitFailure;
+    }
+    ExitStatus status = kExitFailure;
+    {
+        const ScopedLog log(**sink);
+        status = decode();
+    }
+    if (!(*sink)->flush()) {
+        complain("A temporary file for the system log cannot be written.");
+        return status == kExitSuccess ? kExitFailure : status;
+    }
+    return status;
+}
+
+/// What the recordings give, in their order, as decoding one by one would have written it.
+class DecodeCollector {
+public:
+    DecodeCollector(const DecodeOptions& options, DecodeProgress& progress, FileSink* log)
+        : _options(options), _progress(progress), _log(log) {}
+
+    ExitStatus status() const { return _status; }
+
+    bool collect(std::size_t recording, const OrderedWorkers::Outcome& outcome,
+                 const WorkerFiles& files) {
+        readWhole(files.output, standardOutput(_progress));
+        _progress.wipe();
+        readWhole(files.complaints, [](std::string_view sentences) {
+            (void)std::fwrite(sentences.data(), 1, sentences.size(), stderr);
+        });
+        if (_log != nullptr) {
+            readWhole(files.systemLog, [this](std::string_view lines) { _log->append(lines); });
+        }
+        if (outcome.signal != 0) {
+            complain(formatText("%@: the process that decoded it was ended by signal %d.",
+                                {_options.recordings.at(recording), outcome.signal}));
+        }
+        _status = outcome.status == kExitSuccess ? _status : outcome.status;
+        return !outcome.gaveUp && outcome.status != kExitFatalRecord;
+    }
+
+private:
+    const DecodeOptions& _options;
+    DecodeProgress& _progress;
+    FileSink* _log;
+    ExitStatus _status = kExitSuccess;
+};
+
+ExitStatus decodeAtOnce(const DecodeOptions& options, DecodeProgress& progress, unsigned jobs,
+                        FileSink* log) {
+    OrderedWorkers workers(
+        options.recordings.size(), jobs,
+        [&](std::size_t recording, const WorkerFiles& files) {
+            return decodeInWorker(options, progress, recording, files);
+        },
+        [&progress] { progress.look(); });
+    DecodeCollector collector(options, progress, log);
+    const auto error = workers.run(
+        [&collector](std::size_t recording, const auto& outcome, const WorkerFiles& files) {
+            return collector.collect(recording, outcome, files);
+        });
+    if (error) {
+        progress.wipe();
+        complain(error->sentence);
+        return kExitFailure;
+    }
+    return collector.status();
+}
+
+/// How many processes decode. What a live recording gives must not wait for its end; but several
+/// pipes may have one writer, which waits until all of them are opened.
+unsigned jobsFor(const DecodeOptions& options) {
+    const auto& recordings = options.recordings;
+    if (recordings.size() < 2 ||
+        std::find(recordings.begin(), recordings.end(), "-") != recordings.end() ||
+        std::count_if(recordings.begin(), recordings.end(), RecordingFile::isStream) == 1) {
+        return 1;
+    }
+    return options.jobs.value_or(std::thread::hardware_concurrency());
+}
+
+ExitStatus decodeAll(const DecodeOptions& options, FileSink* log) {
+    const MonotonicClock clock;
+    DecodeProgress progress(options.recordings, TerminalLine::onStandardError(), clock);
+    const unsigned jobs = jobsFor(options);
+    return jobs > 1 ? decodeAtOnce(options, progress, jobs, log)
+                    : decodeOneByOne(options, progress);
+}
+
+} // namespace
+
+ExitStatus runDecode(const DecodeOptions& options) {
+    if (const auto loss = lossOfInput(options)) {
+        complain(*loss);
+        return kExitFailure;
+    }
+    if (!options.systemLog) {
+        return decodeAll(options, nullptr);
+    }
+    const auto sink = FileSink::create(*options.systemLog);
+    if (!sink) {
+        complain(sink.error().sentence);
+        return kExitFailure;
+    }
+    const ScopedLog log(**sink);
+    const ExitStatus status = decodeAll(options, sink->get());
+    if (!(*sink)->flush()) {
+        complain("The system log cannot be written to " + *options.systemLog + ".");
+        return status == kExitSuccess ? kExitFailure : status;
+    }
+    return status;
+}
+
+} // namespace pallax

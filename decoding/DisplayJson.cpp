@@ -1,0 +1,181 @@
+#include "decoding/DisplayJson.h"
+
+#include "text/Base64.h"
+#include "text/Printable.h"
+#include "text/Utf8.h"
+
+#include <algorithm>
+#include <array>
+#include <charconv>
+#include <cmath>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kHexDigits = "0123456789abcdef";
+constexpr unsigned char kFirstPrintable = 0x20;
+constexpr unsigned char kDelete = 0x7F;
+constexpr unsigned char kFirstBeyondAscii = 0x80;
+constexpr char32_t kFirstBehindC1 = 0xA0;
+
+bool isPlain(char character) {
+    const auto byte = static_cast<unsigned char>(character);
+    return byte >= kFirstPrintable && byte < kDelete && character != '"' && character != '\\';
+}
+
+void appendEscapedControl(std::string& out, char32_t code) {
+    out += "\\u00";
+    out += kHexDigits[code >> 4U];
+    out += kHexDigits[code & 0xFU];
+}
+
+void appendEscapedAscii(std::string& out, char character) {
+    constexpr std::string_view kNamed = "\"\\\b\f\n\r\t";
+    constexpr std::string_view kNames = "\"\\bfnrt";
+    const std::size_t named = kNamed.find(character);
+    if (named != std::string_view::npos) {
+        out += '\\';
+        out += kNames[named];
+        return;
+    }
+    appendEscapedControl(out, static_cast<unsigned char>(character));
+}
+
+void appendEscaped(std::string& out, std::string_view text) {
+    while (!text.empty()) {
+        std::size_t taken = 1;
+        if (isPlain(text.front())) {
+            out += text.front();
+        } else if (static_cast<unsigned char>(text.front()) < kFirstBeyondAscii) {
+            appendEscapedAscii(out, text.front());
+        } else if (const Utf8CodePoint character = utf8At(text, 0); character.size == 0) {
+            out += kReplacementCharacter;
+        } else {
+            taken = character.size;
+            if (character.value < kFirstBehindC1) {
+                appendEscapedControl(out, character.value);
+            } else {
+                out += text.substr(0, taken);
+            }
+        }
+        text.remove_prefix(taken);
+    }
+}
+
+/// The value is appended first and looked at where it lies, for almost every text is plain.
+void appendStringValue(std::string& out, const PropertyList& object) {
+    out += '"';
+    const std::size_t start = out.size();
+    (void)object.appendString(out);
+    if (!std::all_of(out.begin() + static_cast<std::ptrdiff_t>(start), out.end(), isPlain)) {
+        const std::string text = out.substr(start);
+        out.resize(start);
+        appendEscaped(out, text);
+    }
+    out += '"';
+}
+
+template <class Number>
+void appendNumber(std::string& out, Number number) {
+    constexpr std::size_t kLongest = 32; // "-2.2250738585072014e-308" has 24 characters
+    std::array<char, kLongest> buffer{};
+    const auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), number);
+    out.append(buffer.data(), result.ptr);
+}
+
+void appendReal(std::string& out, double number) {
+    if (std::isfinite(number)) {
+        appendNumber(out, number);
+    } else {
+        out += "null";
+    }
+}
+
+void appendValue(std::string& out, const PropertyList& object, int depth);
+
+void appendArray(std::string& out, const Array& elements, int depth) {
+    out += '[';
+    for (const PropertyList& element : elements) {
+        out += &element == elements.data() ? "" : ",";
+        appendValue(out, element, depth);
+    }
+    out += ']';
+}
+
+void appendDictionary(std::string& out, const Dictionary& entries, int depth) {
+    out += '{';
+    bool first = true;
+    for (const Dictionary::Entry& entry : entries) {
+        if (!entry.hasStringKey) {
+            continue;
+        }
+        out += first ? "" : ",";
+        first = false;
+        appendJsonString(out, entry.key.view());
+        out += ':';
+        appendValue(out, entry.value, depth);
+    }
+    out += '}';
+}
+
+void appendValue(std::string& out, const PropertyList& object, int depth) {
+    using Type = PropertyList::Type;
+    switch (object.type()) {
+    case Type::kNull:
+        out += "null";
+        return;
+    case Type::kString:
+        appendStringValue(out, object);
+        return;
+    case Type::kInteger:
+        if (const auto large = object.largeInteger()) {
+            appendNumber(out, *large);
+        } else {
+            appendNumber(out, *object.integer());
+        }
+        return;
+    case Type::kReal:
+        appendReal(out, *object.real());
+        return;
+    case Type::kBoolean:
+        out += *object.boolean() ? "true" : "false";
+        return;
+    case Type::kData:
+        out += '"';
+        out += base64Text(*object.data());
+        out += '"';
+        return;
+    case Type::kDate:
+        appendJsonString(out, isoDateText(*object.date()).value_or(dateText(*object.date())));
+        return;
+    case Type::kArray:
+    case Type::kDictionary:
+        break;
+    }
+    if (depth >= kDeepestJson) {
+        out += "null";
+    } else if (const DictionaryRef dictionary = object.dictionary()) {
+        appendDictionary(out, *dictionary, depth + 1);
+    } else {
+        appendArray(out, *object.array(), depth + 1);
+    }
+}
+
+} // namespace
+
+void appendJson(std::string& out, const PropertyList& object) {
+    appendValue(out, object, 0);
+}
+
+void appendJsonString(std::string& out, std::string_view text) {
+    out += '"';
+    if (std::all_of(text.begin(), text.end(), isPlain)) {
+        out += text;
+    } else {
+        appendEscaped(out, text);
+    }
+    out += '"';
+}
+
+} // namespace pallax

@@ -1,0 +1,75 @@
+#include "decoding/RecordingDecoder.h"
+
+#include "decoding/RequiredTemplates.h"
+
+#include <exception>
+
+namespace pallax {
+
+RecordingDecoder::RecordingDecoder(const DecoderEnvironment& environment,
+                                   std::string_view technology, Every every, DisplayOutput& output)
+    : _every(every), _output(output),
+      _generator(LogGenerator::generatorFromTechnology(
+          Text(technology), environment.technologies,
+          {_clock, environment.resources, environment.bundle, environment.standardOutput})) {
+    _output.beginRecording();
+}
+
+std::optional<std::string> RecordingDecoder::add(const RecordedPacket& packet) {
+    if (const auto passed = _grid.passedBefore(packet.time)) {
+        tick(*passed);
+    }
+    _clock.set(packet.time);
+    _lastPacket = packet.time;
+    ++_packets;
+    try {
+        _generator->updateState(_state, packet.data);
+    } catch (const TemplateFailure&) {
+        throw;
+    } catch (const std::exception& error) {
+        return error.what();
+    }
+    _updated = true;
+    _unseenBytes += packet.data.size();
+    if (_unseenBytes > kMostUnseenBytes) {
+        (void)generate(packet.time);
+    }
+    if (_every == Every::Packet) {
+        _output.show({_packets, packet.time}, liveDisplay());
+    }
+    return std::nullopt;
+}
+
+void RecordingDecoder::finish() {
+    if (_lastPacket) {
+        tick(_grid.next());
+    }
+    if (_every == Every::End) {
+        _output.show({_packets, _lastPacket.value_or(Time())}, liveDisplay());
+    }
+}
+
+void RecordingDecoder::tick(const TickGrid::Tick& tick) {
+    if (!_updated) {
+        return;
+    }
+    _updated = false;
+    const PropertyList display = generate(tick.time);
+    if (_every == Every::Tick) {
+        _output.show({tick.number, tick.time}, display);
+    }
+}
+
+PropertyList RecordingDecoder::generate(Time now) {
+    _unseenBytes = 0;
+    _clock.set(now);
+    return _generator->generateLogUsingState(_state);
+}
+
+PropertyList RecordingDecoder::liveDisplay() const {
+    _generator->catchUp();
+    const PropertyList* display = _state.find("Display");
+    return display != nullptr ? *display : PropertyList();
+}
+
+} // namespace pallax

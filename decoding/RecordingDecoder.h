@@ -1,0 +1,80 @@
+#pragma once
+
+#include "LogGenerator/LogGenerator.h"
+#include "decoding/DisplayOutput.h"
+#include "decoding/TickGrid.h"
+#include "host/Recording.h"
+#include "platform/Clock.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+
+namespace pallax {
+
+/// What decoding needs besides a recording. All of it outlives the decoder.
+struct DecoderEnvironment {
+    const Resources& resources;
+    const Bundle& bundle;
+    StandardOutput& standardOutput; ///< the generators' notices, which are no part of a display
+    std::span<const Technology> technologies;
+};
+
+/// The clock of a recording: it stands at its latest packet or tick. Its zone is UTC.
+class PacketClock final : public Clock {
+public:
+    Time now() const override { return _now; }
+    Zone zone(Time /*time*/) const override { return {}; }
+    void set(Time now) { _now = now; }
+
+private:
+    Time _now;
+};
+
+/// Decodes the packets of one recording by driving its generator directly. Its display ticks lie
+/// on the grid of a viewer's, but it sees every packet of the recording, a viewer only those that
+/// its start command asked for. What it keeps does not grow with the recording.
+class RecordingDecoder {
+public:
+    /// Packet bytes after which the display is generated although no tick has passed, for a
+    /// generator keeps what it has received since the previous time.
+    static constexpr std::size_t kMostUnseenBytes = std::size_t{1} << 20U;
+
+    RecordingDecoder(const DecoderEnvironment& environment, std::string_view technology,
+                     Every every, DisplayOutput& output);
+
+    /// False when no generator knows the technology; then there is nothing else to do.
+    bool hasGenerator() const { return _generator != nullptr; }
+
+    /// The reason why the packet was dropped, when a record has thrown; else nothing.
+    /// TemplateFailure leaves.
+    std::optional<std::string> add(const RecordedPacket& packet);
+    /// The last tick, and with Every::End the display.
+    void finish();
+
+    std::uint64_t packets() const { return _packets; }
+    /// How the latest packet's stamp stepped, if it did.
+    const std::optional<StampRemark>& step() const { return _grid.step(); }
+
+private:
+    void tick(const TickGrid::Tick& tick);
+    PropertyList generate(Time now);
+    PropertyList liveDisplay() const;
+
+    Every _every;
+    DisplayOutput& _output;
+    PacketClock _clock;
+    std::unique_ptr<LogGenerator> _generator;
+    Dictionary _state;
+    TickGrid _grid;
+    std::uint64_t _packets = 0;
+    std::optional<Time> _lastPacket;
+    bool _updated = false; // since the last tick
+    std::size_t _unseenBytes = 0;
+};
+
+} // namespace pallax

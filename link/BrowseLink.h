@@ -1,0 +1,63 @@
+#pragma once
+
+#include "decoding/FatalRecord.h"
+#include "decoding/RequiredTemplates.h"
+#include "host/AsioMainQueue.h"
+#include "host/BuildBundle.h"
+#include "host/SocketMessagePorts.h"
+#include "host/SourceClock.h"
+#include "host/WallClock.h"
+#include "link/LinkPorts.h"
+#include "monitor/PallaxModel.h"
+#include "telephony/SocketTelephonyService.h"
+
+#include <chrono>
+#include <string>
+
+namespace pallax {
+
+class ChildService;
+class StandardOutput;
+
+/// What a model needs of this machine to browse: the main queue, the ports to the telephony
+/// service (a child's or the machine's), the source's clock, and the templates.
+class BrowseLink {
+public:
+    /// How often a browser looks at the connection, and whether the child service is still there.
+    static constexpr std::chrono::milliseconds kLookInterval{500};
+
+    /// `child` is null for the machine's own service; a child's clients get names of their own,
+    /// made of `localPortName`. Where that name is taken, the link has another for this process
+    /// (see LinkPorts). What is referred to outlives the link.
+    BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
+               StandardOutput& notices,
+               std::string_view localPortName = PallaxModel::kLocalPortName);
+
+    AsioMainQueue& queue() { return _queue; }
+    SourceClock& clock() { return _clock; }
+    const Clock& present() const { return _wallClock; }
+    PallaxModel::Platform modelPlatform(ModelObserver& observer);
+    /// See LinkPorts.
+    const std::string& obstacle() const { return _linkPorts.obstacle(); }
+
+    bool hasChild() const { return _child != nullptr; }
+    /// True once the child has ended; it is left to its owner to reap.
+    bool childHasEnded() const;
+
+private:
+    ChildService* _child;
+    StandardOutput& _notices;
+    std::string _localPortName;
+    AsioMainQueue _queue;
+    WallClock _wallClock;
+    SourceClock _clock;
+    std::string _controlPortName;
+    SocketMessagePorts _socketPorts;
+    SocketTelephonyService _telephony;
+    LinkPorts _linkPorts;
+    GuardedMessagePorts _ports;
+    RequiredTemplates _resources;
+    BuildBundle _bundle;
+};
+
+} // namespace pallax

@@ -1,0 +1,124 @@
+#include "link/Settings.h"
+
+#include "host/Files.h"
+#include "text/Format.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cstdlib>
+#include <filesystem>
+#include <system_error>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kFile = "pallax/pallax.conf";
+constexpr std::string_view kSystemFolder = "/etc/xdg";
+
+std::string_view trimmed(std::string_view text) {
+    constexpr std::string_view kBlanks = " \t\r";
+    const std::size_t start = text.find_first_not_of(kBlanks);
+    if (start == std::string_view::npos) {
+        return {};
+    }
+    return text.substr(start, text.find_last_not_of(kBlanks) - start + 1);
+}
+
+std::optional<int> logLevelIn(std::string_view text) {
+    constexpr int kHighestLevel = 7;
+    int level = 0;
+    const auto result = std::from_chars(text.data(), text.data() + text.size(), level);
+    const bool isWhole = result.ec == std::errc() && result.ptr == text.data() + text.size();
+    return isWhole && level >= 0 && level <= kHighestLevel ? std::optional(level) : std::nullopt;
+}
+
+/// Takes one setting; the reason when it cannot.
+std::optional<std::string> take(Settings& settings, std::string_view key, std::string_view value) {
+    if (key == "on-fatal-record") {
+        if (value != "stop" && value != "skip") {
+            return formatText("on-fatal-record is \"stop\" or \"skip\", not \"%@\"", {value});
+        }
+        settings.onFatalRecord = value == "skip" ? OnFatalRecord::Skip : OnFatalRecord::Stop;
+        return std::nullopt;
+    }
+    if (key == "system-log-level") {
+        const auto level = logLevelIn(value);
+        settings.systemLogLevel = level.value_or(settings.systemLogLevel);
+        return level ? std::nullopt
+                     : std::optional(formatText(
+                           "system-log-level is a number from 0 to 7, not \"%@\"", {value}));
+    }
+    if (key == "after-reconnect") {
+        if (value != "keep" && value != "fresh") {
+            return formatText("after-reconnect is \"keep\" or \"fresh\", not \"%@\"", {value});
+        }
+        settings.afterReconnect = value == "fresh" ? AfterReconnect::Fresh : AfterReconnect::Keep;
+        return std::nullopt;
+    }
+    if (key != "snapshot-directory" && key != "save-button-marker") {
+        return formatText("there is no setting \"%@\"", {key});
+    }
+    if (value.empty()) {
+        return formatText("%@ needs a path", {key});
+    }
+    (key == "snapshot-directory" ? settings.snapshotDirectory : settings.saveButtonMarker) = value;
+    return std::nullopt;
+}
+
+std::optional<std::string> takeLine(Settings& settings, std::string_view line) {
+    if (line.empty() || line.front() == '#') {
+        return std::nullopt;
+    }
+    const std::size_t equals = line.find('=');
+    if (equals == std::string_view::npos) {
+        return "a setting is written \"key = value\"";
+    }
+    return take(settings, trimmed(line.substr(0, equals)), trimmed(line.substr(equals + 1)));
+}
+
+} // namespace
+
+SettingsResult parseSettings(std::string_view text, std::string_view file) {
+    Settings settings;
+    for (int number = 1; !text.empty(); ++number) {
+        const std::string_view line = text.substr(0, text.find('\n'));
+        text.remove_prefix(std::min(line.size() + 1, text.size()));
+        if (const auto reason = takeLine(settings, trimmed(line))) {
+            return SettingsError{formatText("%@, line %d: %@.", {file, number, *reason})};
+        }
+    }
+    return settings;
+}
+
+SettingsResult loadSettings(const std::vector<std::string>& files) {
+    for (const std::string& file : files) {
+        const auto content = readRegularFile(file, kLargestSettings);
+        if (content) {
+            return parseSettings(std::string(content->begin(), content->end()), file);
+        }
+        if (!content.error().isMissing) {
+            return SettingsError{
+                formatText("%@ cannot be read: %@.", {file, content.error().reason})};
+        }
+    }
+    return Settings{};
+}
+
+std::vector<std::string> settingsFiles() {
+    std::vector<std::string> files;
+    const auto add = [&files](const std::filesystem::path& folder) {
+        files.push_back((folder / kFile).string());
+    };
+    const char* configuration = std::getenv("XDG_CONFIG_HOME");
+    const char* home = std::getenv("HOME");
+    if (configuration != nullptr && *configuration == '/') {
+        add(configuration);
+    } else if (home != nullptr && *home != '\0') {
+        add(std::filesystem::path(home) / ".config");
+    }
+    add(kSystemFolder);
+    return files;
+}
+
+} // namespace pallax

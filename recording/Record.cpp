@@ -1,0 +1,86 @@
+#include "recording/Record.h"
+
+#include "console/ScopedLog.h"
+#include "console/TeeSink.h"
+#include "console/TerminalLine.h"
+#include "host/Complaint.h"
+#include "host/Interruption.h"
+#include "host/LogSinks.h"
+#include "link/Settings.h"
+#include "link/WaitNotice.h"
+#include "recording/RecordOptions.h"
+#include "recording/Recorder.h"
+#include "text/Format.h"
+
+#include <algorithm>
+#include <csignal>
+
+namespace pallax {
+
+namespace {
+
+constexpr int kNothing = -1;
+
+ExitStatus record(const RecordOptions& options) {
+    auto directory = SocketDirectory::open();
+    if (!directory) {
+        complain(directory.error().sentence);
+        return kExitFailure;
+    }
+    TerminalLine progress = TerminalLine::onStandardError();
+    const auto files =
+        RecordingFiles::open(options.files, [&progress](const std::string& sentence) {
+            progress.wipe();
+            complain(sentence);
+        });
+    if (!files && files.error().readerHasGone) {
+        return kExitSuccess;
+    }
+    if (!files) {
+        complain(files.error().sentence);
+        return kExitFailure;
+    }
+    std::optional<std::string> failure;
+    {
+        Recorder recorder(
+            std::move(directory).value(), options.technology, **files,
+            [&progress](const std::string& text) { progress.show(text); },
+            [&progress](const std::string& text) {
+                progress.wipe();
+                complainOfWaiting(text);
+            });
+        failure = recorder.run();
+    }
+    progress.leave();
+    if (const auto error = failure ? std::nullopt : (*files)->check()) {
+        failure = Recorder::failureText(*error, **files);
+    }
+    if ((*files)->tooLarge() > 0) {
+        complain(formatText("%llu packets of more than %zu bytes were left out.",
+                            {(*files)->tooLarge(), PcapNgWriter::kLargestPacket}));
+    }
+    if (failure) {
+        complain(*failure);
+        return kExitFailure;
+    }
+    return kExitSuccess;
+}
+
+} // namespace
+
+ExitStatus runRecord(const RecordOptions& options) {
+    const Interruption interruption;
+    const SettingsResult settings = loadSettings(settingsFiles());
+    if (!settings) {
+        complain(settings.error().sentence);
+        return kExitFailure;
+    }
+    SyslogSink syslog("pallax");
+    StderrSink standardError;
+    const int wanted = options.logLevel.value_or(kNothing);
+    TeeSink both(syslog, settings->systemLogLevel, standardError, wanted);
+    const ScopedLog log(both, std::max(settings->systemLogLevel, wanted));
+    return record(options);
+}
+
+} // namespace pallax

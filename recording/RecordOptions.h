@@ -1,0 +1,18 @@
+#pragma once
+
+#include "recording/RecordingFiles.h"
+
+#include <optional>
+
+namespace pallax {
+
+struct RecordedTechnology;
+
+struct RecordOptions {
+    RecordingFiles::Options files;
+    /// What the modem must speak; null: whatever it answers.
+    const RecordedTechnology* technology = nullptr;
+    std::optional<int> logLevel; ///< system-log lines up to it go to standard error
+};
+
+} // namespace pallax

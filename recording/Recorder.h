@@ -1,0 +1,72 @@
+#pragma once
+
+#include "link/BrowseLink.h"
+#include "monitor/PallaxModel.h"
+#include "platform/StandardOutput.h"
+#include "recording/RecordOptions.h"
+#include "recording/RecordingFiles.h"
+#include "recording/RecordingPorts.h"
+
+#include <chrono>
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace pallax {
+
+/// Records what a viewer would be shown: a model opens the log channel and keeps it open, and the
+/// packets go into files instead of into a display, each with the stamp
+/// that the source sent.
+class Recorder final : private LinkListener, private ModelObserver {
+public:
+    /// Gets, about once a second, how far it has come.
+    using Progress = std::function<void(const std::string& text)>;
+    /// How often it tries to connect.
+    static constexpr std::chrono::milliseconds kRetryDelay{500};
+
+    /// `waits` hears what it waits for, as WaitNotice says it.
+    Recorder(SocketDirectory directory, const RecordedTechnology* wanted, RecordingFiles& files,
+             Progress progress, Progress waits);
+
+    /// Records until a signal, the end of the source or of whoever reads a pipe, or a failure:
+    /// nothing, or the failure's sentence.
+    std::optional<std::string> run();
+
+    /// The error's sentence, and how many packets are recorded all the same.
+    static std::string failureText(const HostError& error, const RecordingFiles& files);
+    /// "120 packets, 4800 bytes, 50 packets/s", or that there is no modem yet.
+    static std::string progressText(const RecordingFiles& files, std::uint64_t packetsPerSecond,
+                                    bool isConnected);
+
+private:
+    class NoNotices final : public StandardOutput {
+    public:
+        void printLine(std::string_view /*line*/) override {}
+    };
+
+    bool replied(Bytes reply) override;
+    void packetArrived(Bytes packet) override;
+    void updateViewControllerFromModel() override {}
+    PallaxModel::Platform platform();
+    void tellProgress();
+    void fail(std::string sentence);
+    void stop();
+
+    const RecordedTechnology* _wanted;
+    RecordingFiles& _files;
+    Progress _progress;
+    Progress _waits;
+    const RecordedTechnology* _technology = nullptr; // that the modem has answered
+    bool _isOver = false;                            // nothing more is written
+    std::optional<std::string> _failure;
+    std::uint64_t _packetsTold = 0;
+    NoNotices _notices;
+    BrowseLink _link;
+    PallaxModel::Platform _browsing;
+    RecordingPorts _ports;
+    PallaxModel _model;
+};
+
+} // namespace pallax

@@ -1,0 +1,151 @@
+#include "link/LinkPorts.h"
+
+#include "telephony/ControlMessages.h"
+#include "tests/doubles/ModelFixture.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <iterator>
+#include <set>
+
+namespace pallax {
+namespace {
+
+constexpr const char* kFixedName = "com.norvane.BasebandStateReport.LogChannel";
+constexpr const char* kOwnName = "own";
+
+/// The fake ports, with names that living ports of others have.
+class CrowdedPorts final : public MessagePorts {
+public:
+    explicit CrowdedPorts(doubles::FakePorts& ports) : _ports(ports) {}
+
+    std::set<std::string, std::less<>> taken;
+
+    Local createLocal(std::string_view name, ReceiveCallback receive) override {
+        _ports.localExists = taken.contains(name);
+        return _ports.createLocal(name, std::move(receive));
+    }
+    std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override {
+        return _ports.createRemote(name);
+    }
+
+private:
+    doubles::FakePorts& _ports;
+};
+
+/// A model whose link goes over the ports.
+class LinkPortsTest : public doubles::ModelFixture {
+protected:
+    LinkPortsTest() {
+        PallaxModel::Platform linked = platform;
+        _model = std::make_unique<PallaxModel>(
+            PallaxModel::Platform{_link, _link, linked.queue, linked.timers, linked.generators,
+                                  linked.technologies, linked.observer});
+    }
+
+    /// The lines of priority 3 of a start that fails.
+    Diary failedStart() {
+        (void)errors();
+        _model->startMonitor();
+        EXPECT_FALSE(_model->isConnected());
+        return errors();
+    }
+
+    /// The log channels that were asked for.
+    Diary channels() const {
+        Diary asked;
+        std::copy_if(linkDiary.begin(), linkDiary.end(), std::back_inserter(asked),
+                     [](const std::string& what) { return what.starts_with("channel "); });
+        return asked;
+    }
+
+    CrowdedPorts _crowd{ports};
+    std::string _whyNoPort;
+    bool _isServiceThere = false;
+    LinkPorts _link{{_crowd, telephony, kOwnName, [this] { return _whyNoPort; },
+                     [this] { return _isServiceThere; }}};
+    std::unique_ptr<PallaxModel> _model;
+};
+
+TEST_F(LinkPortsTest, TheFirstViewerHasTheFixedName) {
+    _model->startMonitor();
+    EXPECT_TRUE(_model->isConnected());
+    EXPECT_EQ(linkDiary.front(), std::string("local ") + kFixedName);
+    EXPECT_EQ(channels(), Diary{std::string("channel ") + kFixedName});
+}
+
+TEST_F(LinkPortsTest, WhereTheFixedNameIsTakenTheNextViewerHasANameOfItsOwn) {
+    _crowd.taken = {kFixedName};
+    _model->startMonitor();
+    EXPECT_TRUE(_model->isConnected());
+    EXPECT_EQ(channels(), Diary{"channel own"});
+    const Diary lines = errors();
+    EXPECT_EQ(std::count(lines.begin(), lines.end(), "Local messsage port already exists"), 0);
+    ports.deliver({1}); // to the model, over its own name
+    queue.runReady();
+    EXPECT_EQ(ports.replies().size(), 1U);
+}
+
+TEST_F(LinkPortsTest, EachStartChoosesAnew) {
+    _crowd.taken = {kFixedName};
+    _model->startMonitor();
+    _crowd.taken = {};
+    linkDiary.clear();
+    _model->restartMonitor();
+    EXPECT_EQ(channels(), Diary{std::string("channel ") + kFixedName});
+}
+
+TEST_F(LinkPortsTest, WhereBothNamesAreTakenTheStartFailsAndIsTriedAgain5SecondsLater) {
+    _crowd.taken = {kFixedName, kOwnName};
+    EXPECT_EQ(failedStart(), (Diary{"Local messsage port already exists",
+                                    "Could not create the ports necessary"}));
+    EXPECT_EQ(_link.obstacle(), "The message port own exists already");
+    EXPECT_TRUE(retriesAfter5Seconds());
+}
+
+TEST_F(LinkPortsTest, WhatAStartHasFailedAtIsRemembered) {
+    EXPECT_EQ(_link.obstacle(), "");
+    ports.failLocal = true;
+    _whyNoPort = "The message port x cannot be made at /x: No such file or directory.";
+    EXPECT_EQ(failedStart(), (Diary{"Could not create local message port",
+                                    "Could not create the ports necessary"}));
+    EXPECT_EQ(_link.obstacle(),
+              "The message port x cannot be made at /x: No such file or directory");
+    ports.failLocal = false;
+
+    telephony.reachable = false;
+    EXPECT_EQ(failedStart(), (Diary{"Could not create HXServerConnection",
+                                    "Could not create the ports necessary"}));
+    EXPECT_EQ(_link.obstacle(), "No telephony service is running");
+    _isServiceThere = true;
+    (void)failedStart();
+    EXPECT_EQ(_link.obstacle(), "The telephony service does not answer");
+    telephony.reachable = true;
+
+    ports.failRemote = true;
+    (void)failedStart();
+    EXPECT_EQ(_link.obstacle(), "The telephony service does not answer");
+    ports.failRemote = false;
+
+    reply = {SendError::ReplyTimedOut, std::nullopt};
+    (void)failedStart();
+    EXPECT_EQ(_link.obstacle(), "The modem tells no known technology");
+}
+
+TEST_F(LinkPortsTest, WhyTheServiceGivesNoLogChannelIsToldInWords) {
+    const auto obstacle = [this](std::int32_t domain, std::int32_t code) {
+        telephony.channel = {domain, code, std::nullopt};
+        (void)failedStart();
+        return _link.obstacle();
+    };
+    EXPECT_EQ(obstacle(kServiceErrorDomain, EMFILE),
+              "The telephony service is busy with other clients");
+    EXPECT_EQ(obstacle(kServiceErrorDomain, EIO),
+              "The telephony service has nothing to play to this client");
+    EXPECT_EQ(obstacle(kServiceErrorDomain, ECONNREFUSED),
+              "The telephony service gives no log channel: Connection refused");
+    EXPECT_EQ(obstacle(kPortErrorDomain, 2), "The telephony service does not answer");
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,146 @@
+#include "link/Settings.h"
+
+#include "tests/doubles/Files.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace pallax {
+namespace {
+
+std::string sentenceFor(std::string_view text) {
+    const auto settings = parseSettings(text, "pallax.conf");
+    return settings ? "no error" : settings.error().sentence;
+}
+
+TEST(Settings, AreReadLineByLine) {
+    const auto settings = parseSettings("# a comment\n"
+                                        "\n"
+                                        "  on-fatal-record =  skip \r\n"
+                                        "snapshot-directory=/tmp/a = b\n"
+                                        "system-log-level = 4\n"
+                                        "after-reconnect = fresh\n"
+                                        "save-button-marker = /tmp/marker",
+                                        "pallax.conf");
+    ASSERT_TRUE(settings);
+    EXPECT_EQ(settings->onFatalRecord, OnFatalRecord::Skip);
+    EXPECT_EQ(settings->snapshotDirectory, "/tmp/a = b");
+    EXPECT_EQ(settings->saveButtonMarker, "/tmp/marker");
+    EXPECT_EQ(settings->systemLogLevel, 4);
+    EXPECT_EQ(settings->afterReconnect, AfterReconnect::Fresh);
+    EXPECT_EQ(parseSettings("after-reconnect = keep", "pallax.conf")->afterReconnect,
+              AfterReconnect::Keep);
+}
+
+TEST(Settings, WithoutAFileTheDefaultsHold) {
+    const auto settings = loadSettings({"/does/not/exist"});
+    ASSERT_TRUE(settings);
+    EXPECT_EQ(settings->onFatalRecord, OnFatalRecord::Stop);
+    EXPECT_EQ(settings->snapshotDirectory, std::nullopt);
+    EXPECT_EQ(settings->saveButtonMarker, std::nullopt);
+    EXPECT_EQ(settings->systemLogLevel, 3);
+    EXPECT_EQ(settings->afterReconnect, AfterReconnect::Keep);
+}
+
+TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
+    EXPECT_EQ(sentenceFor("\n\ncolour = red\n"),
+              "pallax.conf, line 3: there is no setting \"colour\".");
+    EXPECT_EQ(sentenceFor("on-fatal-record = maybe"),
+              "pallax.conf, line 1: on-fatal-record is \"stop\" or \"skip\", not \"maybe\".");
+    EXPECT_EQ(sentenceFor("after-reconnect = never"),
+              "pallax.conf, line 1: after-reconnect is \"keep\" or \"fresh\", not \"never\".");
+    EXPECT_EQ(sentenceFor("snapshot-directory ="),
+              "pallax.conf, line 1: snapshot-directory needs a path.");
+    for (const char* level : {"8", "-1", "4x", "", "warning", "99999999999"}) {
+        EXPECT_EQ(sentenceFor(std::string("\nsystem-log-level = ") + level),
+                  std::string("pallax.conf, line 2: system-log-level is a number from 0 to 7, "
+                              "not \"") +
+                      level + "\".");
+    }
+    EXPECT_EQ(sentenceFor("skip"), "pallax.conf, line 1: a setting is written \"key = value\".");
+}
+
+class SettingsFileTest : public testing::Test {
+protected:
+    doubles::TemporaryFolder folder;
+};
+
+TEST_F(SettingsFileTest, TheFirstFileThatExistsHoldsAlone) {
+    const std::string first = folder.write("first", "snapshot-directory = /a\n");
+    const std::string second = folder.write("second", "on-fatal-record = skip\n");
+    const auto settings = loadSettings({folder.path("missing"), first, second});
+    ASSERT_TRUE(settings);
+    EXPECT_EQ(settings->snapshotDirectory, "/a");
+    EXPECT_EQ(settings->onFatalRecord, OnFatalRecord::Stop);
+}
+
+TEST_F(SettingsFileTest, AFolderInItsPlaceCannotBeRead) {
+    const auto settings = loadSettings({folder.path()});
+    ASSERT_FALSE(settings);
+    EXPECT_EQ(settings.error().sentence, folder.path() + " cannot be read: it is a folder.");
+}
+
+TEST_F(SettingsFileTest, ANamedPipeIsRefusedWithoutWaitingForIt) {
+    const std::string pipe = folder.path("pipe");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
+    const auto settings = loadSettings({pipe});
+    ASSERT_FALSE(settings);
+    EXPECT_EQ(settings.error().sentence, pipe + " cannot be read: it is no regular file.");
+}
+
+TEST_F(SettingsFileTest, AMebibyteIsTheMost) {
+    const std::string file = folder.write("large", std::string(1U << 20U, '\n'));
+    EXPECT_TRUE(loadSettings({file}));
+    (void)folder.write("large", std::string((1U << 20U) + 1, '\n'));
+    const auto settings = loadSettings({file});
+    ASSERT_FALSE(settings);
+    EXPECT_EQ(settings.error().sentence, file + " cannot be read: it has more than 1048576 bytes.");
+}
+
+TEST_F(SettingsFileTest, WhatCannotBeLookedAtIsNotMissing) {
+    const std::string circle = folder.path("circle");
+    std::filesystem::create_symlink(circle, circle);
+    const std::string file = folder.write("file", "");
+    const auto settings = loadSettings({circle + "/pallax.conf", file});
+    ASSERT_FALSE(settings);
+    EXPECT_EQ(settings.error().sentence, circle + "/pallax.conf cannot be read: Too many levels "
+                                                  "of symbolic links.");
+    EXPECT_TRUE(loadSettings({file + "/pallax.conf", folder.path("none/pallax.conf")}))
+        << "below a file there can be none";
+}
+
+TEST_F(SettingsFileTest, AFolderThatMayNotBeEnteredIsAnError) {
+    const std::string file = folder.write("pallax.conf", "on-fatal-record = skip\n");
+    std::filesystem::permissions(folder.path(), std::filesystem::perms::none);
+    const bool isRoot = ::geteuid() == 0;
+    constexpr uid_t kNobody = 65534;
+    if (isRoot) {
+        ASSERT_EQ(::seteuid(kNobody), 0);
+    }
+    const auto settings = loadSettings({file});
+    if (isRoot) {
+        ASSERT_EQ(::seteuid(0), 0);
+    }
+    std::filesystem::permissions(folder.path(), std::filesystem::perms::owner_all);
+    ASSERT_FALSE(settings);
+    EXPECT_EQ(settings.error().sentence, file + " cannot be read: Permission denied.");
+}
+
+TEST(SettingsFiles, AreTheUsersThenTheSystems) {
+    ::setenv("HOME", "/home/somebody", 1);
+    ::setenv("XDG_CONFIG_HOME", "/conf", 1);
+    EXPECT_EQ(settingsFiles(), (std::vector<std::string>{"/conf/pallax/pallax.conf",
+                                                         "/etc/xdg/pallax/pallax.conf"}));
+    ::unsetenv("XDG_CONFIG_HOME");
+    EXPECT_EQ(settingsFiles(),
+              (std::vector<std::string>{"/home/somebody/.config/pallax/pallax.conf",
+                                        "/etc/xdg/pallax/pallax.conf"}));
+}
+
+} // namespace
+} // namespace pallax
