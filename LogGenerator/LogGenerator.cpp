@@ -38,6 +38,12 @@ PropertyList LogGenerator::generateLogUsingState(Dictionary& /*state*/) {
     throw UnrecognisedOperation("generateLogUsingState:");
 }
 
+PropertyList LogGenerator::display(const Dictionary& state) {
+    catchUp();
+    const PropertyList* display = state.find("Display");
+    return display != nullptr ? *display : PropertyList();
+}
+
 bool LogGenerator::keepsDisplay(const Dictionary& state) const {
     return state.find("Display") != nullptr;
 }

@@ -52,6 +52,9 @@ public:
     virtual void updateState(Dictionary& state, Bytes data);
     /// The display dictionary, or null when there is none yet. Rotates history and raw capture.
     virtual PropertyList generateLogUsingState(Dictionary& state);
+    /// The live display, with every packet that has arrived, or null when there is none yet. Its
+    /// sections are those of the history's entries, which are up to date afterwards too.
+    PropertyList display(const Dictionary& state);
     /// Brings the live display up to the latest packet, for whoever looks at it, or at the history,
     /// without generating it: a generator may read a packet as late as that.
     virtual void catchUp() {}

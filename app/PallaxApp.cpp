@@ -126,7 +126,7 @@ void PallaxApp::showSaveView() {
             .queue = _surroundings.queue,
             .snapshotDirectory = _surroundings.snapshotDirectory,
             .closeSaveView = whileAlive(&PallaxApp::closeSaveView),
-            .catchUp = whileAlive(&PallaxApp::catchUp),
+            .bringUpToDate = whileAlive(&PallaxApp::bringUpToDate),
         },
         _model ? _model->getSaveContents() : PropertyList()));
     if (_navController) {
@@ -134,9 +134,9 @@ void PallaxApp::showSaveView() {
     }
 }
 
-void PallaxApp::catchUp() {
+void PallaxApp::bringUpToDate() {
     if (_model) {
-        _model->catchUp();
+        (void)_model->display();
     }
 }
 

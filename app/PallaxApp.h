@@ -77,8 +77,8 @@ public:
     void showSaveView() override;
     /// Closes it if it is open.
     void closeSaveView();
-    /// Brings what is to be saved up to the latest packet.
-    void catchUp();
+    /// Updates the displays that the snapshot screen saves, with every packet that has arrived.
+    void bringUpToDate();
     void updateStatusForViewController(PallaxPaneController& pane);
     /// Reloads every pane, or pops back to below the first whose path has vanished; then the
     /// status of the top pane.

@@ -57,7 +57,7 @@ std::string PallaxSaveViewController::snapshotPath() const {
 }
 
 void PallaxSaveViewController::savePressed() {
-    _surroundings.catchUp();
+    _surroundings.bringUpToDate();
     const PropertyList root = writableInXml(
         snapshot(dateText(_timeStamp), _saveHistory, saveDescription().text()),
         [](const std::string& place) {

@@ -31,9 +31,9 @@ public:
         std::string snapshotDirectory;
         /// The application's; posted to the queue, where it may run after the screen's end.
         std::function<void()> closeSaveView;
-        /// Brings the displays that are saved, whose sections are the live ones, up to the latest
-        /// packet.
-        std::function<void()> catchUp;
+        /// Updates the displays that are saved, whose sections are the live ones, with every packet
+        /// that has arrived.
+        std::function<void()> bringUpToDate;
     };
 
     /// `saveHistory` is an array, or null when there are no save contents.

@@ -67,9 +67,7 @@ PropertyList RecordingDecoder::generate(Time now) {
 }
 
 PropertyList RecordingDecoder::liveDisplay() const {
-    _generator->catchUp();
-    const PropertyList* display = _state.find("Display");
-    return display != nullptr ? *display : PropertyList();
+    return _generator->display(_state);
 }
 
 } // namespace pallax

@@ -66,7 +66,7 @@ void feed(LogGenerator& generator, Dictionary& state, Bytes packet) {
     }
     require(state.find("Display")->dictionary() == nullptr ||
             state.find("Display")->dictionary()->empty()); // to come
-    generator.catchUp();
+    (void)generator.display(state);
     requireDisplayForm(*state.find("Display"), true);
     require(state.find("ExtraInfo")->dictionary()->empty());
 }

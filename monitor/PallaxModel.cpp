@@ -266,10 +266,8 @@ PropertyList PallaxModel::getSaveContents() const {
     return _logGenerator ? _logGenerator->getSaveContentsFromState(_state) : PropertyList();
 }
 
-void PallaxModel::catchUp() {
-    if (_logGenerator) {
-        _logGenerator->catchUp();
-    }
+PropertyList PallaxModel::display() {
+    return _logGenerator ? _logGenerator->display(_state) : PropertyList();
 }
 
 } // namespace pallax

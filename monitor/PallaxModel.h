@@ -75,10 +75,10 @@ public:
     /// The node that stands at `path` ("/", "/Serving Cell"), or null.
     NodeRef nodeAtPath(std::string_view path);
     /// The generator's save contents (an array), or null without a generator. The sections of their
-    /// displays are the live ones, up to date after `catchUp`.
+    /// displays are the live ones, which are up to date after a call of `display`.
     PropertyList getSaveContents() const;
-    /// Brings the live display up to the latest packet.
-    void catchUp();
+    /// The live display, with every packet that has arrived; null while there is none.
+    PropertyList display();
 
 private:
     void retryLater();

@@ -55,7 +55,7 @@ protected:
                                                    .snapshotDirectory =
                                                        "/var/mobile/Library/Logs/Faultbox",
                                                    .closeSaveView = [this] { ++closes; },
-                                                   .catchUp = [] {}},
+                                                   .bringUpToDate = [] {}},
             saveHistory);
         screen = made.get();
         return made;

@@ -41,12 +41,10 @@ protected:
         for (const ByteBuffer& packet : packets) {
             generator.updateState(state, packet);
         }
-        generator.catchUp();
     }
-    static std::string displayIn(const Dictionary& state) {
+    static std::string shownBy(LogGenerator& generator, const Dictionary& state) {
         std::string text;
-        const PropertyList* display = state.find("Display");
-        appendJson(text, display != nullptr ? *display : PropertyList());
+        appendJson(text, generator.display(state));
         return text;
     }
 
@@ -69,14 +67,14 @@ TEST_F(KeptDisplay, AGeneratorTellsForEachPairOfTechnologiesWhetherTheDisplayWil
             const auto before = generatorOf(first);
             EXPECT_FALSE(before->keepsDisplay(state)) << first << ", the first one";
             feed(*before, state, packetsOf(firstSample, false));
-            const std::string shown = displayIn(state);
+            const std::string shown = shownBy(*before, state);
             ASSERT_GT(shown.size(), 100U) << first;
 
             const auto after = generatorOf(second);
             const bool isKept = after->keepsDisplay(state);
             feed(*after, state, packetsOf(secondSample, true));
             feed(*after, state, Packets(1, packetsOf(secondSample, false).front()));
-            EXPECT_EQ(displayIn(state) == shown, isKept) << first << ", then " << second;
+            EXPECT_EQ(shownBy(*after, state) == shown, isKept) << first << ", then " << second;
         }
     }
 }

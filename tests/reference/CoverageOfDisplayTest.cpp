@@ -105,9 +105,8 @@ public:
 
     void feed(Bytes packet) {
         _generator->updateState(_state, packet);
-        _generator->catchUp();
-        if (const PropertyList* display = _state.find("Display")) {
-            _keys.see(*display);
+        if (const PropertyList display = _generator->display(_state); !display.isNull()) {
+            _keys.see(display);
         }
     }
 

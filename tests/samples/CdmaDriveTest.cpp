@@ -29,7 +29,7 @@ protected:
     void play() {
         for (const SamplePacket& packet : cdmaDrivePackets()) {
             _generator->updateState(_state, packet.data);
-            _generator->catchUp();
+            (void)_generator->display(_state);
             for (const Dictionary::Entry& name : *_state.find("Lookup")->dictionary()) {
                 _shown[name.key.string()].insert(valueOf(name));
             }

@@ -16,8 +16,7 @@ class IfxStream : public testing::Test {
 protected:
     void feed(const SamplePacket& packet) {
         _generator->updateState(_state, packet.data);
-        _generator->catchUp();
-        _display = _state.find("Display")->dictionary();
+        _display = _generator->display(_state).dictionary();
     }
     const PropertyList& shown(std::string_view key) const { return *_display->find(key); }
 

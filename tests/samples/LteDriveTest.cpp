@@ -23,14 +23,13 @@ TEST(LteDrive, FillsEverySectionBeforeItEnds) {
     std::set<std::string> technologies;
     for (const SamplePacket& packet : lteDrivePackets()) {
         generator->updateState(state, packet.data);
-        generator->catchUp();
-        const DictionaryRef display = state.find("Display")->dictionary();
+        const DictionaryRef display = generator->display(state).dictionary();
         for (const PropertyList& each : *display->find("Reselection Candidates List")->array()) {
             const PropertyList* technology = each.dictionary()->find("Candidate RAT Type");
             technologies.insert(technology->string().value_or("(no text)"));
         }
     }
-    const DictionaryRef display = state.find("Display")->dictionary();
+    const DictionaryRef display = generator->display(state).dictionary();
     ASSERT_EQ(display->size(), 11U);
     for (const Dictionary::Entry& section : *display) {
         EXPECT_TRUE(isFilled(section.value)) << section.key.string();

@@ -36,9 +36,8 @@ protected:
     }
 
     bool isFilled(std::string_view section) const {
-        const PropertyList* display = _state.find("Display");
-        const PropertyList* value =
-            display != nullptr ? display->dictionary()->find(section) : nullptr;
+        const DictionaryRef display = _generator->display(_state).dictionary();
+        const PropertyList* value = display != nullptr ? display->find(section) : nullptr;
         if (value == nullptr) {
             ADD_FAILURE() << section << " is not in the display";
             return false;

@@ -48,11 +48,7 @@ public:
     void feed(Bytes message) { _generator->updateState(_state, message); }
     const LogGenerator& generator() const { return *_generator; }
 
-    const DictionaryRef display() const {
-        _generator->catchUp();
-        const PropertyList* display = _state.find("Display");
-        return display != nullptr ? display->dictionary() : nullptr;
-    }
+    const DictionaryRef display() const { return _generator->display(_state).dictionary(); }
     const PropertyList& section(std::string_view name) const {
         static const PropertyList kNone;
         const PropertyList* found = display() != nullptr ? display()->find(name) : nullptr;
