@@ -18,7 +18,7 @@ Result<std::uint64_t, std::string> parseSize(const std::string& text) {
     const std::string_view rest(result.ptr, static_cast<std::size_t>(end - result.ptr));
     const std::size_t unit = rest.size() == 1 ? kUnits.find(rest.front()) : kUnits.npos;
     if (result.ec == std::errc::invalid_argument || (!rest.empty() && unit == kUnits.npos)) {
-        return "\"" + text + "\" is no size like 4096, 64k, 100M or 2G";
+        return "\"" + text + "\" is not a size such as 4096, 64k, 100M or 2G";
     }
     const auto shift = rest.empty() ? 0U : kBitsPerUnit * static_cast<unsigned>(unit + 1);
     if (result.ec != std::errc() || number == 0 ||
@@ -34,7 +34,7 @@ Result<std::chrono::nanoseconds, std::string> parseSeconds(const std::string& te
     const char* end = text.data() + text.size();
     const auto result = std::from_chars(text.data(), end, seconds);
     if (result.ec == std::errc::invalid_argument || result.ptr != end || std::isnan(seconds)) {
-        return "\"" + text + "\" is no number of seconds";
+        return "\"" + text + "\" is not a number of seconds";
     }
     if (result.ec != std::errc() || seconds <= 0 || seconds > kMost) {
         return "\"" + text + "\" is out of range, which is above 0 and up to 1000000000";

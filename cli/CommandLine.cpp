@@ -82,14 +82,14 @@ CommandLine::CommandLine()
                                       "pallax")) {
     prepare(*_app);
     addBrowse(*_app, _browse);
-    addDecode(addCommand("decode", "Recordings to JSON or CSV"), _decode);
+    addDecode(addCommand("decode", "Convert recordings to JSON or CSV"), _decode);
     addRecord(addCommand("record", "Write the live channel to a recording"), _record);
     addService(addCommand("service", "Run the telephony service that viewers connect to"),
                _service);
     CLI::App& demo = addCommand("demo", "Browse a simulated modem");
     addDemo(demo, _demo.simulation.emplace(), _demo.play);
     addView(demo, _demo);
-    addSimulate(addCommand("simulate", "Write a simulated modem's packets as a recording"),
+    addSimulate(addCommand("simulate", "Write a simulated modem's packets to a recording"),
                 _simulate);
     addTexts();
 }
@@ -108,8 +108,8 @@ void CommandLine::addTexts() {
     CLI::App& manual = addCommand("manual", "Write a manual page");
     completion.footer(kCompletionFooter)->group("");
     manual.footer(kManualFooter)->group("");
-    addName(completion, "SHELL", _shell, completionShells(), "Whose script");
-    addName(manual, "PAGE", _page, manualPages(description()), "Which page");
+    addName(completion, "SHELL", _shell, completionShells(), "The shell");
+    addName(manual, "PAGE", _page, manualPages(description()), "The page");
 }
 
 CommandDescription CommandLine::description() const {

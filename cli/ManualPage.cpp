@@ -13,13 +13,13 @@ namespace {
 constexpr const char* kSurroundings = R"(.SH ENVIRONMENT
 .TP
 .B XDG_RUNTIME_DIR
-Where the sockets lie by which viewers and the service find each other, in its folder pallax.
+Its folder pallax contains the sockets that connect viewers and the service.
 .TP
 .B XDG_CONFIG_HOME
-Where the settings lie, in its folder pallax.
+Its folder pallax contains the settings.
 .TP
 .B PALLAX_RESOURCES
-The folder of the display templates, if it is not that of the installation.
+The folder of the display templates, if not in the installation.
 .TP
 .B NO_COLOR
 If set, the screen is drawn without colours.
@@ -29,7 +29,7 @@ If set, the screen is drawn without colours.
 The user's settings.
 .TP
 .I /etc/xdg/pallax/pallax.conf
-The system's settings, read where there are none of the user's.
+The system's settings, read if the user has none.
 )";
 
 std::string italic(std::string_view text) {

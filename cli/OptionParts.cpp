@@ -14,8 +14,8 @@ CLI::ValidationError unknownChoice(const std::string& name, const std::string& t
     for (std::string each; std::getline(rest, each, '|');) {
         known.push_back(each);
     }
-    return CLI::ValidationError(name,
-                                "\"" + text + "\" is none of " + names + suggestion(text, known));
+    return CLI::ValidationError(name, "\"" + text + "\" is not one of " + names +
+                                          suggestion(text, known));
 }
 
 CLI::Option* addSpeed(CLI::App& app, PlayOptions& play) {
@@ -29,7 +29,7 @@ CLI::Option* addSpeed(CLI::App& app, PlayOptions& play) {
     };
     return app
         .add_option_function<std::string>("--speed", takeSpeed,
-                                          "Play that many times as fast; max: as fast as possible")
+                                          "Play this many times as fast; max: as fast as possible")
         ->type_name("X|max");
 }
 

@@ -19,17 +19,17 @@ constexpr const char* kFooter = R"(Examples:
   pallax drive.pcap --speed 4          browse a recording, four times as fast
   modem-dump | pallax -                browse what another program records
   pallax demo                          browse a simulated modem
-  pallax decode drive.pcap             its last display as JSON
+  pallax decode drive.pcap             print its last display as JSON
   pallax decode --every tick --format csv drive.pcap > drive.csv
-  pallax record drive.pcapng           write what the live modem sends to a file
-  pallax service --play drive.pcap     let viewers connect to a played recording
+  pallax record drive.pcapng           record the live modem
+  pallax service --play drive.pcap     play a recording to viewers
 
-Each command has a help of its own (pallax decode --help). A recording named
-like a command is given with its folder (pallax ./decode).
+Each command has its own help (pallax decode --help). To open a recording with
+the name of a command, add its folder (pallax ./decode).
 
 Exit status:
-  0   success, also when nobody reads the output any more
-  1   failure: one sentence on standard error tells which
+  0   success, or the reader of the output has gone
+  1   failure, explained in one sentence on standard error
   2   wrong usage
   70  ended by a fatal record (--keep-going drops it instead))";
 
@@ -40,15 +40,15 @@ constexpr const char* kDecodeFooter = R"(Examples:
   pallax decode --system-log drive.log drive.pcap
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
-standard input; a recording may be a named pipe. What comes through a pipe is
-written as it comes; several pipes are read at once and written one after the
-other. On a terminal, what takes more than two seconds shows how far it has
-come, and characters that could command the terminal stand as escapes (\x1B,
-\u202E); files and pipes get CSV as the modem sent it.
+standard input; a recording may be a named pipe. Displays from a pipe are
+written without delay; several pipes are read in parallel and written one after
+the other. On a terminal, runs of more than two seconds show their progress, and
+characters that could command the terminal are escaped (\x1B, \u202E); CSV in
+files and pipes is as the modem sent it.
 
 Exit status:
-  0   success, also when nobody reads the output any more
-  1   failure: a recording or template cannot be read, or the output be written
+  0   success, or the reader of the output has gone
+  1   failure: cannot read a recording or template, or write the output
   2   wrong usage
   70  with --strict: ended by a fatal record)";
 
@@ -58,14 +58,14 @@ constexpr const char* kRecordFooter = R"(Examples:
   pallax record - | ssh desk pallax service --relay -
 
 With --rotate-size or --rotate-seconds the files are drive-0001.pcapng,
-drive-0002.pcapng, ... up to 9999. Recording ends with Ctrl-C, and with the
-source. A viewer may run at the same time. Where no service runs, it says so and
-waits for one.
+drive-0002.pcapng, ... up to 9999. Recording stops on Ctrl-C or at the end of
+the source. A viewer can run at the same time. If no service is running, record
+says so and waits for one.
 
-A file holds one technology. When the modem comes back with another one, the
-recording goes on in drive-2.pcapng, or in the next number. With --overwrite an
-earlier file stays as it is until the first packet comes. A file that is removed
-or changed by others while it is being written ends the recording.
+A file holds one technology. If the modem returns with another one, recording
+continues in drive-2.pcapng, or the next free number. With --overwrite, existing
+files are kept until the first packet arrives. Recording stops if another
+program removes or changes the file.
 
 Exit status:
   0   success: ended by Ctrl-C, by the source, or by the reader of the output
@@ -74,7 +74,7 @@ Exit status:
 
 void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
     addSpeed(app, play)->needs(recording);
-    app.add_flag("--loop", play.loop, "Begin again at the recording's end")->needs(recording);
+    app.add_flag("--loop", play.loop, "Restart at the end of the recording")->needs(recording);
 }
 
 void addLogLevel(CLI::App& app, std::optional<int>& level) {
@@ -89,18 +89,17 @@ void addLogLevel(CLI::App& app, std::optional<int>& level) {
 
 void addView(CLI::App& app, BrowseOptions& options) {
     app.add_flag("--print", options.print,
-                 "Print the tree as text at each display tick, as is done without a terminal");
-    addChoice<terminal::ColorUse>(
-        app, "--color", options.color,
-        {{"auto", terminal::ColorUse::Auto},
-         {"always", terminal::ColorUse::Always},
-         {"never", terminal::ColorUse::Never}},
-        "Colour on the screen (default: auto, which is never where NO_COLOR is set)");
+                 "Print the tree as text at each display tick (the default without a terminal)");
+    addChoice<terminal::ColorUse>(app, "--color", options.color,
+                                  {{"auto", terminal::ColorUse::Auto},
+                                   {"always", terminal::ColorUse::Always},
+                                   {"never", terminal::ColorUse::Never}},
+                                  "Colour on the screen (default: auto; never if NO_COLOR is set)");
     app.add_flag_callback(
         "--no-mouse", [&options] { options.mouse = false; },
-        "Leave the mouse to the terminal, so that text can be selected");
+        "Leave the mouse to the terminal, to select text");
     app.add_flag("--keep-going", options.keepGoing,
-                 "Drop a record that cannot be read instead of ending with status 70");
+                 "Drop a record that cannot be read instead of exiting with status 70");
     addLogLevel(app, options.logLevel);
 }
 
@@ -121,8 +120,8 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
     CLI::Option* recording =
         app.add_option(
                "RECORDING", options.recording,
-               "A recording (pcap or pcapng, a file or a named pipe; - is standard input) to "
-               "browse as it is played; without one, the live modem")
+               "The recording to browse (pcap or pcapng, a file or a named pipe; - is standard "
+               "input; default: the live modem)")
             ->type_name("");
     addView(app, options);
     addPlay(app, options.play, recording);
@@ -131,14 +130,14 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
 
 void addDecode(CLI::App& app, DecodeOptions& options) {
     addTechnology(app, options.technology,
-                  "What the recordings are of (otherwise their link type tells)");
+                  "The technology of the recordings (default: from their link type)");
     addChoice<std::optional<Every>>(
         app, "--every", options.every,
         {{"end", Every::End}, {"tick", Every::Tick}, {"packet", Every::Packet}},
-        "When the display is written (default: end; for csv, tick)");
+        "When to write the display (default: end; for csv, tick)");
     addChoice<DecodeFormat>(app, "--format", options.format,
                             {{"json", DecodeFormat::Json}, {"csv", DecodeFormat::Csv}},
-                            "JSON, one object a line, or CSV (default: json)");
+                            "JSON, one object per line, or CSV (default: json)");
     app.add_option("--system-log", options.systemLog, "Write every system-log line to this file")
         ->type_name("FILE");
     constexpr unsigned kMostJobs = 1024;
@@ -147,10 +146,10 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
            [&options](const std::string& text) {
                options.jobs = numberOf("--jobs", text, 1U, kMostJobs);
            },
-           "How many recordings to decode at once (default: as many as there are cores)")
+           "How many recordings to decode at once (default: one per core)")
         ->type_name("N");
     app.add_flag("--strict", options.strict,
-                 "End with status 70 at a record that cannot be read instead of skipping it");
+                 "Exit with status 70 at a record that cannot be read instead of skipping it");
     app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
         ->required()
         ->type_name("");
@@ -171,7 +170,7 @@ void addRecord(CLI::App& app, RecordOptions& options) {
         options.files.rotateSize = *size;
     };
     app.add_option_function<std::string>("--rotate-size", takeSize,
-                                         "Begin the next file before one has more bytes than that")
+                                         "Start the next file before one exceeds this size")
         ->type_name("BYTES[k|M|G]");
     const auto takeSeconds = [&options](const std::string& text) {
         const auto seconds = parseSeconds(text);
@@ -181,11 +180,11 @@ void addRecord(CLI::App& app, RecordOptions& options) {
         options.files.rotateAfter = *seconds;
     };
     app.add_option_function<std::string>("--rotate-seconds", takeSeconds,
-                                         "Begin the next file after so many seconds")
+                                         "Start the next file after this many seconds")
         ->type_name("SECONDS");
     app.add_flag_callback(
         "--overwrite", [&options] { options.files.existing = PcapNgWriter::Existing::Overwrite; },
-        "Replace files that exist already");
+        "Replace existing files");
     addLogLevel(app, options.logLevel);
     app.footer(kRecordFooter);
 }
@@ -194,7 +193,7 @@ void addRecord(CLI::App& app, RecordOptions& options) {
 ParseEnd wrongUsage(std::string reason, const std::string& command) {
     std::replace(reason.begin(), reason.end(), '\n', ' ');
     const std::string page = command.empty() ? "pallax" : "pallax " + command;
-    return {kExitWrongUsage, "pallax: " + reason + " (" + page + " --help tells more)\n"};
+    return {kExitWrongUsage, "pallax: " + reason + " (see " + page + " --help)\n"};
 }
 
 ParsedOptions parseOptions(std::vector<std::string> arguments) {

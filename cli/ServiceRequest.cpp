@@ -15,16 +15,16 @@ constexpr const char* kServiceFooter = R"(Examples:
   ssh phone modem-dump | pallax service --relay -
   pallax service --status
 
-Every client gets a channel of its own. A recording or simulation begins anew
-for each, but a named pipe is played once, to the first. What is relayed goes to
-all as it comes, and the service ends with it; the stream waits for its first
-client, as long as --wait says.
-A client that is too slow loses packets and delays nobody; with --speed max it
-sets its own pace and loses nothing.
+Each client gets its own channel. A recording or simulation restarts for each
+client; a named pipe is played once, to the first. A relayed stream goes live to
+all clients, after a wait for the first one (--wait), and the service ends with
+it.
+A slow client loses packets but delays no other client; with --speed max it sets
+its own pace and loses nothing.
 
 Exit status:
-  0   success: ended by Ctrl-C, or by the whole of what was relayed
-  1   failure: one sentence on standard error tells which
+  0   success: ended by Ctrl-C, or at the regular end of the relayed stream
+  1   failure, explained in one sentence on standard error
   2   wrong usage)";
 
 void addServicePlay(CLI::App& app, ServiceOptions& options) {
@@ -32,7 +32,7 @@ void addServicePlay(CLI::App& app, ServiceOptions& options) {
         app.add_option("--play", options.recording, "The recording to play to each client")
             ->type_name("RECORDING");
     addSpeed(app, options.play);
-    app.add_flag("--loop", options.play.loop, "Begin again at the recording's end")
+    app.add_flag("--loop", options.play.loop, "Restart at the end of the recording")
         ->needs(recording);
 }
 
@@ -48,7 +48,7 @@ void addServiceRelay(CLI::App& app, std::string& relayed, ServiceOptions& option
         relayed = text;
     };
     app.add_option_function<std::string>(
-           "--relay", take, "Pass on the live pcap stream of standard input (-) to every client")
+           "--relay", take, "Relay the live pcap stream on standard input (-) to every client")
         ->type_name("-")
         ->excludes("--play")
         ->excludes("--speed") // the stream has its own
@@ -56,20 +56,20 @@ void addServiceRelay(CLI::App& app, std::string& relayed, ServiceOptions& option
     constexpr double kLongest = 1e6; // eleven days
     const auto takePatience = [&options](const double& seconds) {
         if (!(seconds >= 0 && seconds <= kLongest)) {
-            throw CLI::ValidationError("--wait", "it takes a number from 0 to 1000000");
+            throw CLI::ValidationError("--wait", "must be a number from 0 to 1000000");
         }
         options.relayPatience = std::chrono::duration_cast<std::chrono::nanoseconds>(
             std::chrono::duration<double>(seconds));
     };
     app.add_option_function<double>(
            "--wait", takePatience,
-           "How long what is relayed waits for its first client (default: 10)")
+           "How long a relayed stream waits for its first client (default: 10)")
         ->type_name("SECONDS")
         ->needs("--relay");
 }
 
 void addServiceStatus(CLI::App& app, bool& status) {
-    app.add_flag("--status", status, "Print what the running service serves, and end")
+    app.add_flag("--status", status, "Print the status of the running service and exit")
         ->excludes("--play")
         ->excludes("--speed")
         ->excludes("--simulate")

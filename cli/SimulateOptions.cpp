@@ -16,10 +16,10 @@ constexpr const char* kDemoFooter = R"(Examples:
   pallax demo lte --seed 7 --speed 4   another car, four times as fast
   pallax demo --print --seconds 60 --speed max
 
-The same seed shows the same drive. Without --seconds it goes on until left.
+The same seed gives the same drive. Without --seconds it runs until you quit.
 
 Exit status:
-  0   success, also when nobody reads the output any more
+  0   success, or the reader of the output has gone
   1   failure: the simulated modem cannot be started, or has ended too early
   2   wrong usage)";
 
@@ -28,15 +28,15 @@ constexpr const char* kSimulateFooter = R"(Examples:
   pallax simulate lte --seconds 60 -o - | pallax decode -
 
 The same technology, seed, rate and duration give the same file. An existing
-file is replaced. On a terminal, what takes more than two seconds shows how far
-it has come.
+file is replaced. On a terminal, runs of more than two seconds show their
+progress.
 
 Exit status:
-  0   success, also when nobody reads the output any more
+  0   success, or the reader of the output has gone
   1   failure: the recording cannot be written
   2   wrong usage)";
 
-constexpr const char* kUntilWhen = "End after so many simulated seconds (default: never)";
+constexpr const char* kUntilWhen = "End after this many simulated seconds (default: never)";
 
 CLI::Option* addSeed(CLI::App& app, const std::function<void(std::uint64_t)>& take) {
     return app
@@ -46,7 +46,7 @@ CLI::Option* addSeed(CLI::App& app, const std::function<void(std::uint64_t)>& ta
                 take(numberOf<std::uint64_t>("--seed", text, 0,
                                              std::numeric_limits<std::uint64_t>::max()));
             },
-            "Which drive: the same number gives the same packets (default: 1)")
+            "Number of the drive; the same number gives the same packets (default: 1)")
         ->type_name("N");
 }
 
@@ -58,7 +58,7 @@ CLI::Option* addRate(CLI::App& app, const std::function<void(unsigned)>& take) {
         .add_option_function<std::string>(
             "--rate",
             [take](const std::string& text) { take(numberOf("--rate", text, kLeast, kMost)); },
-            "Packets a second (default: 40)")
+            "Packets per second (default: 40)")
         ->type_name("N");
 }
 
@@ -114,7 +114,7 @@ void addDemo(CLI::App& app, SimulationOptions& simulation, PlayOptions& play) {
     addTechnology(
         app, "TECHNOLOGY",
         [&simulation](const RecordedTechnology* technology) { simulation.technology = technology; },
-        "What the simulated modem speaks (default: lte)");
+        "Technology of the simulated modem (default: lte)");
     addCommon(app, simulation);
     addSeconds(
         app, [&simulation](std::chrono::seconds duration) { simulation.duration = duration; },
@@ -129,14 +129,14 @@ void addSimulate(CLI::App& app, SimulateOptions& options) {
         [&options](const RecordedTechnology* technology) {
             options.simulation.technology = technology;
         },
-        "What the simulated modem speaks")
+        "Technology of the simulated modem")
         ->required();
     addSeconds(
         app, [&options](std::chrono::seconds duration) { options.simulation.duration = duration; },
-        "How much time the recording covers")
+        "Duration of the recording")
         ->required();
     addCommon(app, options.simulation);
-    app.add_option("-o,--output", options.file, "Where to; - is standard output")
+    app.add_option("-o,--output", options.file, "The file to write; - is standard output")
         ->required()
         ->type_name("FILE");
     app.footer(kSimulateFooter);

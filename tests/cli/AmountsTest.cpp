@@ -13,7 +13,7 @@ TEST(Amounts, ASizeIsANumberWithAUnit) {
     EXPECT_EQ(*parseSize("17179869183G"), 18446744072635809792U);
     for (const std::string wrong : {"", "k", "1K", "1kk", "-1", "1.5M", " 1", "1 "}) {
         EXPECT_EQ(parseSize(wrong).error(),
-                  "\"" + wrong + "\" is no size like 4096, 64k, 100M or 2G");
+                  "\"" + wrong + "\" is not a size such as 4096, 64k, 100M or 2G");
     }
     for (const std::string far : {"0", "0k", "99999999999999999999", "17179869184G"}) {
         EXPECT_EQ(parseSize(far).error(),
@@ -27,7 +27,7 @@ TEST(Amounts, SecondsAreANumberAbove0) {
     EXPECT_EQ(*parseSeconds("1e9"), std::chrono::seconds(1'000'000'000));
     EXPECT_EQ(*parseSeconds("1e-30"), nanoseconds(1)) << "never 0";
     for (const std::string wrong : {"", "x", "nan", "1s", " 1"}) {
-        EXPECT_EQ(parseSeconds(wrong).error(), "\"" + wrong + "\" is no number of seconds");
+        EXPECT_EQ(parseSeconds(wrong).error(), "\"" + wrong + "\" is not a number of seconds");
     }
     for (const std::string far : {"0", "-1", "1000000001", "inf", "1e999"}) {
         EXPECT_EQ(parseSeconds(far).error(),

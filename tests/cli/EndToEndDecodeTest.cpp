@@ -201,7 +201,7 @@ TEST_F(EndToEnd, WrongUsageIsStatus2AndOneSentence) {
     EXPECT_EQ(wrong.out, "");
     EXPECT_EQ(
         wrong.err,
-        "pallax: --every: \"day\" is none of end|tick|packet (pallax decode --help tells more)\n");
+        "pallax: --every: \"day\" is not one of end|tick|packet (see pallax decode --help)\n");
     EXPECT_EQ(run({"--version"}).status, 0);
 }
 

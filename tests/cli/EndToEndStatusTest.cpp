@@ -85,8 +85,7 @@ TEST_F(EndToEndStatus, OfBrowsing) {
           "pallax: " + world.path("broken.pcap") + " is empty.\n"});
     ends({{"--speed", "0", sample},
           2,
-          "pallax: --speed: \"0\" is neither a number above 0 nor max (pallax --help tells "
-          "more)\n"});
+          "pallax: --speed: \"0\" is neither a number above 0 nor max (see pallax --help)\n"});
     ends({{path, "--print", "--speed", "max"}, 70, "pallax: " + fatalReason()});
     ends({{path, "--print", "--speed", "max", "--keep-going"}, 0, ""});
     expectEveryDocumentedStatus({"pallax"});
@@ -102,7 +101,7 @@ TEST_F(EndToEndStatus, OfDecode) {
           "pallax: Standard output cannot be written: No space left on device.\n",
           "/dev/null",
           "/dev/full"});
-    ends({{"decode"}, 2, "pallax: RECORDING is required (pallax decode --help tells more)\n"});
+    ends({{"decode"}, 2, "pallax: RECORDING is required (see pallax decode --help)\n"});
     ends({{"decode", "--strict", path}, 70, "pallax: " + path + ": " + fatalReason()});
     expectEveryDocumentedStatus({"decode"});
 }
@@ -117,7 +116,7 @@ TEST_F(EndToEndStatus, OfRecord) {
     ends({{"record", "--technology", "lte", world.path("other.pcapng")},
           1,
           "pallax: The modem's technology is Zorell_GSM (gsm), not lte.\n"});
-    ends({{"record"}, 2, "pallax: FILE is required (pallax record --help tells more)\n"});
+    ends({{"record"}, 2, "pallax: FILE is required (see pallax record --help)\n"});
     expectEveryDocumentedStatus({"record"});
     service.signal(SIGTERM);
     EXPECT_EQ(service.wait(), 0);
@@ -132,8 +131,8 @@ TEST_F(EndToEndStatus, OfService) {
     ends({{"service", "--status"}, 1, "pallax: No telephony service is running.\n"});
     ends({{"service"},
           2,
-          "pallax: the service needs --play, --simulate, --relay or --status (pallax service "
-          "--help tells more)\n"});
+          "pallax: the service needs --play, --simulate, --relay or --status (see pallax service "
+          "--help)\n"});
     expectEveryDocumentedStatus({"service"});
 }
 
@@ -149,8 +148,8 @@ TEST_F(EndToEndStatus, OfDemo) {
           {"XDG_RUNTIME_DIR=" + nowhere}});
     ends({{"demo", "ltr"},
           2,
-          "pallax: TECHNOLOGY: \"ltr\" is none of ifx|gsm|cdma|lte|utran. Did you mean \"lte\"? "
-          "(pallax demo --help tells more)\n"});
+          "pallax: TECHNOLOGY: \"ltr\" is not one of ifx|gsm|cdma|lte|utran. Did you mean \"lte\"? "
+          "(see pallax demo --help)\n"});
     expectEveryDocumentedStatus({"demo"});
 }
 
@@ -161,7 +160,7 @@ TEST_F(EndToEndStatus, OfSimulate) {
           "pallax: The recording /dev/full cannot be written: No space left on device.\n"});
     ends({{"simulate", "lte", "-o", world.path("new.pcap")},
           2,
-          "pallax: --seconds is required (pallax simulate --help tells more)\n"});
+          "pallax: --seconds is required (see pallax simulate --help)\n"});
     expectEveryDocumentedStatus({"simulate"});
 }
 
@@ -170,10 +169,10 @@ TEST_F(EndToEndStatus, OfTheTextsForPackages) {
         "pallax: Standard output cannot be written: No space left on device.\n";
     ends({{"completion", "bash"}, 0, ""});
     ends({{"completion", "bash"}, 1, full, "/dev/null", "/dev/full"});
-    ends({{"completion"}, 2, "pallax: SHELL is required (pallax completion --help tells more)\n"});
+    ends({{"completion"}, 2, "pallax: SHELL is required (see pallax completion --help)\n"});
     ends({{"manual", "pallax"}, 0, ""});
     ends({{"manual", "pallax"}, 1, full, "/dev/null", "/dev/full"});
-    ends({{"manual"}, 2, "pallax: PAGE is required (pallax manual --help tells more)\n"});
+    ends({{"manual"}, 2, "pallax: PAGE is required (see pallax manual --help)\n"});
 }
 
 } // namespace

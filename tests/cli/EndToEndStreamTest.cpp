@@ -153,13 +153,12 @@ TEST_F(EndToEndStream, CannotBeginAgain) {
     const Run browsed = run({pipe, "--print", "--loop"});
     EXPECT_EQ(browsed.status, 2);
     EXPECT_EQ(browsed.err, "pallax: " + pipe +
-                               " can be played only once, not with --loop (pallax --help tells "
-                               "more)\n");
+                               " can be played only once, not with --loop (see pallax --help)\n");
     const Run service = run({"service", "--play", pipe, "--loop"});
     EXPECT_EQ(service.status, 2);
-    EXPECT_EQ(service.err, "pallax: " + pipe +
-                               " can be played only once, not with --loop (pallax service --help "
-                               "tells more)\n");
+    EXPECT_EQ(service.err,
+              "pallax: " + pipe +
+                  " can be played only once, not with --loop (see pallax service --help)\n");
 }
 
 } // namespace

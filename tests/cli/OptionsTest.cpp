@@ -62,9 +62,8 @@ TEST(Options, ColourAndMouseAreTheTerminalsUnlessToldOtherwise) {
     EXPECT_EQ(always.color, terminal::ColorUse::Always);
     const auto wrong = std::get<ParseEnd>(parseOptions({"--color", "blue"}));
     EXPECT_EQ(wrong.status, kExitWrongUsage);
-    EXPECT_EQ(
-        wrong.text,
-        "pallax: --color: \"blue\" is none of auto|always|never (pallax --help tells more)\n");
+    EXPECT_EQ(wrong.text,
+              "pallax: --color: \"blue\" is not one of auto|always|never (see pallax --help)\n");
 }
 
 TEST(Options, ARecordingNamedLikeACommandIsGivenWithItsFolder) {
@@ -204,28 +203,25 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
         EXPECT_EQ(end.status, kExitWrongUsage);
         return end.text;
     };
-    EXPECT_EQ(sentence({"demo", "wimax"}),
-              "pallax: TECHNOLOGY: \"wimax\" is none of ifx|gsm|cdma|lte|utran (pallax demo --help "
-              "tells more)\n");
+    EXPECT_EQ(sentence({"demo", "wimax"}), "pallax: TECHNOLOGY: \"wimax\" is not one of "
+                                           "ifx|gsm|cdma|lte|utran (see pallax demo --help)\n");
     EXPECT_EQ(sentence({"demo", "--seconds", "0"}),
-              "pallax: --seconds: \"0\" is no whole number from 1 to 31622400 (pallax demo --help "
-              "tells more)\n");
+              "pallax: --seconds: \"0\" is no whole number from 1 to 31622400 (see pallax demo "
+              "--help)\n");
     EXPECT_EQ(
         sentence({"demo", "--rate", "x"}),
-        "pallax: --rate: \"x\" is no whole number from 5 to 1000000 (pallax demo --help tells "
-        "more)\n");
+        "pallax: --rate: \"x\" is no whole number from 5 to 1000000 (see pallax demo --help)\n");
     EXPECT_EQ(sentence({"simulate", "lte", "-o", "a"}),
-              "pallax: --seconds is required (pallax simulate --help tells more)\n");
+              "pallax: --seconds is required (see pallax simulate --help)\n");
     EXPECT_EQ(sentence({"service", "--seed", "3"}),
-              "pallax: --seed requires --simulate (pallax service --help tells more)\n");
+              "pallax: --seed requires --simulate (see pallax service --help)\n");
     EXPECT_EQ(sentence({"service", "--play", "a", "--seconds", "3"}),
-              "pallax: --seconds requires --simulate (pallax service --help tells more)\n");
+              "pallax: --seconds requires --simulate (see pallax service --help)\n");
     EXPECT_EQ(sentence({"service", "--relay", "-", "--speed", "2"}),
-              "pallax: --speed excludes --relay (pallax service --help tells more)\n");
-    EXPECT_EQ(
-        sentence({"service", "--speed", "2"}),
-        "pallax: the service needs --play, --simulate, --relay or --status (pallax service --help "
-        "tells more)\n");
+              "pallax: --speed excludes --relay (see pallax service --help)\n");
+    EXPECT_EQ(sentence({"service", "--speed", "2"}),
+              "pallax: the service needs --play, --simulate, --relay or --status (see pallax "
+              "service --help)\n");
 }
 
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
@@ -265,66 +261,58 @@ std::string wrongUsage(std::vector<std::string> arguments) {
 TEST(Options, WrongUsageIsOneClearSentence) {
     EXPECT_EQ(
         wrongUsage({"decode", "--every", "day", "a"}),
-        "pallax: --every: \"day\" is none of end|tick|packet (pallax decode --help tells more)\n");
+        "pallax: --every: \"day\" is not one of end|tick|packet (see pallax decode --help)\n");
     EXPECT_EQ(wrongUsage({"--speed", "0", "a"}),
-              "pallax: --speed: \"0\" is neither a number above 0 nor max (pallax --help tells "
-              "more)\n");
-    EXPECT_EQ(wrongUsage({"decode"}),
-              "pallax: RECORDING is required (pallax decode --help tells more)\n");
-    EXPECT_EQ(
-        wrongUsage({"service"}),
-        "pallax: the service needs --play, --simulate, --relay or --status (pallax service --help "
-        "tells more)\n");
-    EXPECT_EQ(wrongUsage({"a", "decode", "b"}),
-              "pallax: the command \"decode\" must come first, without options before it (pallax "
-              "--help tells more)\n");
+              "pallax: --speed: \"0\" is neither a number above 0 nor max (see pallax --help)\n");
+    EXPECT_EQ(wrongUsage({"decode"}), "pallax: RECORDING is required (see pallax decode --help)\n");
+    EXPECT_EQ(wrongUsage({"service"}), "pallax: the service needs --play, --simulate, --relay or "
+                                       "--status (see pallax service --help)\n");
+    EXPECT_EQ(wrongUsage({"a", "decode", "b"}), "pallax: the command \"decode\" must come first, "
+                                                "without options before it (see pallax --help)\n");
     EXPECT_EQ(wrongUsage({"--print", "decode", "b"}),
-              "pallax: the command \"decode\" must come first, without options before it (pallax "
-              "--help tells more)\n");
+              "pallax: the command \"decode\" must come first, without options before it (see "
+              "pallax --help)\n");
 }
 
 TEST(Options, WrongUsageOfTheServiceAndTheRecorderIsOneClearSentence) {
     EXPECT_EQ(
         wrongUsage({"service", "--relay", "a.pcap"}),
-        "pallax: --relay: only -, standard input, can be relayed (pallax service --help tells "
-        "more)\n");
+        "pallax: --relay: only -, standard input, can be relayed (see pallax service --help)\n");
     for (const char* seconds : {"-1", "1000001", "nan"}) {
-        EXPECT_EQ(wrongUsage({"service", "--relay", "-", "--wait", seconds}),
-                  "pallax: --wait: it takes a number from 0 to 1000000 (pallax service --help "
-                  "tells more)\n");
+        EXPECT_EQ(
+            wrongUsage({"service", "--relay", "-", "--wait", seconds}),
+            "pallax: --wait: must be a number from 0 to 1000000 (see pallax service --help)\n");
     }
     EXPECT_EQ(wrongUsage({"service", "--play", "a.pcap", "--wait", "1"}),
-              "pallax: --wait requires --relay (pallax service --help tells more)\n");
+              "pallax: --wait requires --relay (see pallax service --help)\n");
     EXPECT_EQ(wrongUsage({"service", "--relay", "-", "--play", "a"}),
-              "pallax: --play excludes --relay (pallax service --help tells more)\n");
+              "pallax: --play excludes --relay (see pallax service --help)\n");
     EXPECT_EQ(wrongUsage({"service", "--status", "--play", "a"}),
-              "pallax: --play excludes --status (pallax service --help tells more)\n");
-    EXPECT_EQ(wrongUsage({"record"}),
-              "pallax: FILE is required (pallax record --help tells more)\n");
+              "pallax: --play excludes --status (see pallax service --help)\n");
+    EXPECT_EQ(wrongUsage({"record"}), "pallax: FILE is required (see pallax record --help)\n");
     EXPECT_EQ(wrongUsage({"record", "--rotate-size", "big", "a"}),
-              "pallax: --rotate-size: \"big\" is no size like 4096, 64k, 100M or 2G (pallax record "
-              "--help tells more)\n");
+              "pallax: --rotate-size: \"big\" is not a size such as 4096, 64k, 100M or 2G (see "
+              "pallax record --help)\n");
     EXPECT_EQ(wrongUsage({"record", "--rotate-size", "0", "a"}),
               "pallax: --rotate-size: \"0\" is out of range, which is from 1 to 17179869183G "
-              "(pallax record --help tells more)\n");
+              "(see pallax record --help)\n");
     EXPECT_EQ(wrongUsage({"record", "--rotate-seconds", "long", "a"}),
-              "pallax: --rotate-seconds: \"long\" is no number of seconds (pallax record --help "
-              "tells more)\n");
+              "pallax: --rotate-seconds: \"long\" is not a number of seconds (see pallax record "
+              "--help)\n");
     EXPECT_EQ(wrongUsage({"record", "--rotate-seconds", "1e10", "a"}),
               "pallax: --rotate-seconds: \"1e10\" is out of range, which is above 0 and up to "
-              "1000000000 (pallax record --help tells more)\n");
+              "1000000000 (see pallax record --help)\n");
     EXPECT_EQ(wrongUsage({"record", ""}),
-              "pallax: FILE is an empty name (pallax record --help tells more)\n");
+              "pallax: FILE is an empty name (see pallax record --help)\n");
     EXPECT_EQ(wrongUsage({"record", "--rotate-size", "1M", "-"}),
               "pallax: standard output is one recording, without --rotate-size and "
-              "--rotate-seconds (pallax record --help tells more)\n");
+              "--rotate-seconds (see pallax record --help)\n");
 }
 
 TEST(Options, WhatNobodyKnowsIsNamed) {
     EXPECT_NE(wrongUsage({"--colour", "red"}).find("--colour"), std::string::npos);
     EXPECT_NE(wrongUsage({"a.pcap", "b.pcap"}).find("b.pcap"), std::string::npos);
-    EXPECT_EQ(wrongUsage({"--loop"}),
-              "pallax: --loop requires RECORDING (pallax --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"--loop"}), "pallax: --loop requires RECORDING (see pallax --help)\n");
     EXPECT_NE(wrongUsage({"--log-level", "8"}).find("--log-level"), std::string::npos);
     EXPECT_NE(wrongUsage({"decode", "--technology", "5g", "a"}).find("ifx|gsm|cdma|lte|utran"),
               std::string::npos);
@@ -336,16 +324,16 @@ TEST(Options, WhatNobodyKnowsIsNamed) {
 TEST(Options, AMistypedCommandOrChoiceIsAnsweredWithTheNearest) {
     EXPECT_EQ(wrongUsage({"decod", "x"}),
               "pallax: \"decod\" is neither a command nor a recording. Did you mean \"decode\"? "
-              "(pallax --help tells more)\n");
+              "(see pallax --help)\n");
     EXPECT_EQ(wrongUsage({"dmeo"}),
               "pallax: \"dmeo\" is neither a command nor a recording. Did you mean \"demo\"? "
-              "(pallax --help tells more)\n");
+              "(see pallax --help)\n");
     EXPECT_EQ(wrongUsage({"simulate", "ltee"}),
-              "pallax: TECHNOLOGY: \"ltee\" is none of ifx|gsm|cdma|lte|utran. Did you mean "
-              "\"lte\"? (pallax simulate --help tells more)\n");
+              "pallax: TECHNOLOGY: \"ltee\" is not one of ifx|gsm|cdma|lte|utran. Did you mean "
+              "\"lte\"? (see pallax simulate --help)\n");
     EXPECT_EQ(wrongUsage({"decode", "--every", "tcik", "a"}),
-              "pallax: --every: \"tcik\" is none of end|tick|packet. Did you mean \"tick\"? "
-              "(pallax decode --help tells more)\n");
+              "pallax: --every: \"tcik\" is not one of end|tick|packet. Did you mean \"tick\"? "
+              "(see pallax decode --help)\n");
     EXPECT_EQ(parsed<BrowseOptions>({"drive"}).recording, "drive") << "near to nothing";
 }
 
@@ -364,24 +352,22 @@ TEST(Options, CompletionAndManualAreTextsThatTheHelpDoesNotName) {
     const ParseEnd script = ended({"completion", "bash"});
     EXPECT_EQ(script.status, kExitSuccess);
     EXPECT_NE(script.text.find("complete -F _pallax pallax\n"), std::string::npos);
-    EXPECT_EQ(
-        wrongUsage({"completion", "csh"}),
-        "pallax: SHELL: \"csh\" is none of bash|zsh|fish. Did you mean \"zsh\"? (pallax completion "
-        "--help tells more)\n");
-    EXPECT_EQ(wrongUsage({"manual"}),
-              "pallax: PAGE is required (pallax manual --help tells more)\n");
+    EXPECT_EQ(wrongUsage({"completion", "csh"}),
+              "pallax: SHELL: \"csh\" is not one of bash|zsh|fish. Did you mean \"zsh\"? (see "
+              "pallax completion --help)\n");
+    EXPECT_EQ(wrongUsage({"manual"}), "pallax: PAGE is required (see pallax manual --help)\n");
     const std::string help = ended({"--help"}).text;
     EXPECT_EQ(help.find("completion"), std::string::npos);
     EXPECT_EQ(help.find("manual"), std::string::npos);
 }
 
 TEST(Options, StandardInputCannotBeLooped) {
-    EXPECT_EQ(wrongUsage({"-", "--loop"}),
-              "pallax: standard input can be played only once, not with --loop (pallax --help "
-              "tells more)\n");
+    EXPECT_EQ(
+        wrongUsage({"-", "--loop"}),
+        "pallax: standard input can be played only once, not with --loop (see pallax --help)\n");
     EXPECT_EQ(wrongUsage({"service", "--play", "-", "--loop"}),
-              "pallax: standard input can be played only once, not with --loop (pallax service "
-              "--help tells more)\n");
+              "pallax: standard input can be played only once, not with --loop (see pallax service "
+              "--help)\n");
 }
 
 } // namespace

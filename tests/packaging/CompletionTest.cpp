@@ -113,12 +113,12 @@ TEST_F(Completion, FishOffersCommandsOptionsChoicesAndFiles) {
     const auto inFish = [this](const std::string& line) {
         return offered("fish", "set -x HOME $PWD\nsource ./.script\ncomplete -C '" + line + "'\n");
     };
-    EXPECT_EQ(inFish("pallax dec"), "decode\tRecordings to JSON or CSV\n");
+    EXPECT_EQ(inFish("pallax dec"), "decode\tConvert recordings to JSON or CSV\n");
     EXPECT_EQ(inFish("pallax decode --ev"),
-              "--every\tWhen the display is written (default: end; for csv, tick)\n");
+              "--every\tWhen to write the display (default: end; for csv, tick)\n");
     EXPECT_EQ(inFish("pallax simulate cd"), "cdma\n");
-    EXPECT_EQ(inFish("pallax --color n"), "never\tColour on the screen (default: auto, which is "
-                                          "never where NO_COLOR is set)\n");
+    EXPECT_EQ(inFish("pallax --color n"),
+              "never\tColour on the screen (default: auto; never if NO_COLOR is set)\n");
     EXPECT_EQ(inFish("pallax decode dr"), "drive.pcap\n");
     EXPECT_EQ(inFish("pallax demo dr"), "");
 }
@@ -132,7 +132,7 @@ TEST_F(Completion, ZshTakesTheScript) {
         offered("zsh", "compdef() { print compdef $* }\n_arguments() { print -l -- \"$@\" }\n"
                        "source ./.script\nwords=(pallax simulate '')\nCURRENT=3\n_pallax\n");
     EXPECT_TRUE(told.starts_with("compdef _pallax pallax\n-s\n")) << told;
-    EXPECT_NE(told.find("\n(-o --output)-o[Where to; - is standard output]:FILE:_files\n"),
+    EXPECT_NE(told.find("\n(-o --output)-o[The file to write; - is standard output]:FILE:_files\n"),
               std::string::npos)
         << told;
     EXPECT_NE(told.find(":ifx|gsm|cdma|lte|utran:(ifx gsm cdma lte utran)\n"), std::string::npos)

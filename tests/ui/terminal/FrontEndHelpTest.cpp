@@ -35,11 +35,11 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
               │ /                 filter rows by name or value  │
               │ s                 save a snapshot               │
               │ y                 copy the value                │
-              │ R                 connect anew, drop old values │
-              │ Tab               next field of the save screen │
-              │ Click, wheel      open what is clicked; scroll  │
-              │ Ctrl-L            draw the screen again         │
-              │ Ctrl-Z            suspend; fg comes back        │
+              │ R                 reconnect, drop old values    │
+              │ Tab               next field on the save screen │
+              │ Click, wheel      open the row; scroll          │
+              │ Ctrl-L            redraw the screen             │
+              │ Ctrl-Z            suspend; fg resumes           │
               │ ?                 this help                     │
               │ q                 back; at the first pane, quit │
               │ Ctrl-C            quit                          │
