@@ -142,7 +142,7 @@ std::string valueOf(const FieldDescription& field) {
         return numberOf(shownAs);
     }
     if (!field.position) {
-        return "as it comes";
+        return "as sent";
     }
     return shownAs.labels.empty() ? quoted(shownAs.beyond) : labelsOf(shownAs, rawRangeOf(field));
 }
@@ -154,7 +154,7 @@ std::string placeOf(const Extent& extent) {
     }
     switch (extent.origin) {
     case Extent::Origin::Record:
-        return text + " of the record";
+        return text + " of the log record";
     case Extent::Origin::Companion:
         return text + " of the companion";
     case Extent::Origin::Here:
@@ -163,11 +163,11 @@ std::string placeOf(const Extent& extent) {
     return text;
 }
 
-/// "from byte 29 on, further behind by 6 for each unit of byte 27, every 14 bytes"
+/// "from byte 29, plus 6 for each unit of byte 27, every 14 bytes"
 std::string inWords(const EntryRun& run) {
-    std::string text = "from byte " + std::to_string(run.layout.start) + " on";
+    std::string text = "from byte " + std::to_string(run.layout.start);
     if (run.move) {
-        text += ", further behind by " + std::to_string(run.move->bytes) + " for each unit of " +
+        text += ", plus " + std::to_string(run.move->bytes) + " for each unit of " +
                 inWords(run.move->count);
     }
     return text + ", every " + std::to_string(run.layout.stride) +
@@ -191,9 +191,8 @@ std::string countOf(const ListDescription& list) {
     if (!list.count) {
         return std::to_string(list.plus) + " entries";
     }
-    return "As many entries as " + inWords(*list.count) +
-           (list.count->width == kByteBits ? " tells" : " tell") +
-           (list.plus != 0 ? ", and " + std::to_string(list.plus) + " more" : "");
+    return "Number of entries: " + inWords(*list.count) +
+           (list.plus != 0 ? " plus " + std::to_string(list.plus) : "");
 }
 
 /// "the first serving cell of GSM or UMTS"
@@ -208,7 +207,8 @@ std::string inWords(const ListPartDescription& part) {
         text.append(before).append(technology.substr(kRadioAccessTechnology.size()));
         before = " or ";
     }
-    return text + (part.kind == ListPartDescription::Kind::EachCell ? ", so that the last one stays" : "");
+    return text +
+           (part.kind == ListPartDescription::Kind::EachCell ? "; the last one remains" : "");
 }
 
 } // namespace
@@ -291,35 +291,34 @@ std::string unitOf(const FieldDescription& field) {
 
 std::string layoutOf(const ListDescription& list) {
     std::string text = countOf(list);
-    text += list.formula.empty() ? ", " + inWords(list.entries) + "."
-                                 : "; " + std::string(list.formula) + ".";
+    text += "; " + (list.formula.empty() ? inWords(list.entries) : std::string(list.formula)) + ".";
     if (list.companion) {
         text += " Each has a companion, " + inWords(*list.companion) + ".";
     }
     if (list.entryName) {
-        text += " An entry is named by " + inWords(*list.entryName) + ".";
+        text += " The name of an entry is " + inWords(*list.entryName) + ".";
     }
     if (list.only) {
-        text += " Shown are those of which " + inWords(*list.only) + ".";
+        text += " An entry is shown only if " + inWords(*list.only) + ".";
     }
     if (list.fit == ListDescription::Fit::AllOrNothing) {
-        text += " All must lie inside the record.";
+        text += " All must lie inside the log record.";
     } else if (list.fit == ListDescription::Fit::Exact) {
-        text += " The record must end with the last one.";
+        text += " The log record must end with the last one.";
     }
     text += sizeCheckOf(list);
     if (!list.ifEmpty.empty()) {
         text += " Without entries " + quoted(list.ifEmpty) + ".";
     }
-    text += list.staysWithoutEntries ? " Without entries the list stays as it was." : "";
+    text += list.staysWithoutEntries ? " Without entries the list does not change." : "";
     return text + (list.isShown ? "" : " They are not shown.");
 }
 
 std::string demandsOf(const CodeDescription& code) {
     std::string text;
     if (code.listPart) {
-        text = "A property list from byte " + std::to_string(LogRecord::kHeaderLength) +
-               " on: " + inWords(*code.listPart) + ".";
+        text = "A property list from byte " + std::to_string(LogRecord::kHeaderLength) + ": " +
+               inWords(*code.listPart) + ".";
     } else {
         text = (code.exactLength ? "Exactly " : "At least ") + std::to_string(code.minimumLength) +
                " bytes.";

@@ -8,19 +8,18 @@ namespace pallax {
 namespace {
 
 constexpr std::string_view kHowToRead = R"(
-The effective log code of a record is its 16-bit code, with 0xFF0000 added for the extended log type.
-A record is counted from its log type, byte 0, so that its body begins at byte 13; an entry of a list
-and a subpacket are counted from their own first byte. The columns:
+The effective log code is the 16-bit log code, plus 0xFF0000 for the extended log type. Bytes of a log
+record are counted from its log type, byte 0, so the body begins at byte 13. Bytes of an entry or a
+subpacket are counted from its own first byte. The columns:
 
-- **byte**: the bytes that a field is read from, or the key of a property list that holds the value.
-- **bits**: how many bits, from which bit on (0 is the lowest of the first byte; without a word it is
-  0), the low bits in the lower bytes. Numbers are unsigned and little-endian unless the column says
-  otherwise.
-- **shown as**: what the display makes of that number, "raw" in formulas, with the format of C's
-  printf where there is one; of a label the numbers and their texts.
-- **unit**: of a number that is shown.
+- **byte**: the bytes of the field, or the property-list key of the value.
+- **bits**: the number of bits and the first bit (default: 0, the lowest of the first byte), low bits in
+  the lower bytes. Numbers are unsigned and little-endian unless the column says otherwise.
+- **shown as**: how the number, "raw" in formulas, is displayed, with its printf format if any; for
+  labels, the numbers and their texts.
+- **unit**: the unit of the displayed number.
 
-Bytes beyond the end of a record read as zero, and a list ends at the first entry that is not whole.
+Bytes past the end of a log record read as zero, and a list ends at the first incomplete entry.
 
 The dissector in `extras/wireshark` shows all of this.
 )";
@@ -89,9 +88,8 @@ std::string sectionOf(const TechnologyReference& technology, const SectionRefere
 
 std::string recordTablesIndex(std::span<const TechnologyReference> technologies) {
     std::string text(
-        "# Log records\n\nWhat Pallax reads of the log records of each technology, and "
-        "what it shows of it. These files are\nwritten by `make_reference` out of the "
-        "tables that the records are decoded with.\n\n"
+        "# Log records\n\nHow Pallax reads and shows the log records of each technology. "
+        "`make_reference` writes these files from\nthe tables that the decoder uses.\n\n"
         "| technology | link type | on the command line | tables |\n|---|---|---|---|\n");
     for (const TechnologyReference& each : technologies) {
         const std::string name(each.technology->commandName);
@@ -105,12 +103,12 @@ std::string recordTablesIndex(std::span<const TechnologyReference> technologies)
 std::string recordTables(const TechnologyReference& technology) {
     std::string text = "# " + std::string(technology.title) + "\n\n";
     if (technology.technology->commandName == "ifx") {
-        text += "An IFX modem sends no log records: each message is a property list that holds the "
-                "whole picture, and\nthe display is whatever comes. These sections and keys are "
-                "known to come; every value is a text as the\nmodem gives it. A dictionary of one "
-                "entry gives way to its value, and the first element of a list is\nleft out.\n";
+        text += "An IFX modem sends no log records: each message is a property list with the whole "
+                "display. These\nare the known sections and keys; every value is a text as the "
+                "modem sends it. A dictionary with one\nentry is replaced by its value, and the "
+                "first element of a list is omitted.\n";
     } else {
-        text += "How to read the tables is told in [README.md](README.md).\n";
+        text += "[README.md](README.md) explains how to read the tables.\n";
     }
     for (const SectionReference& section : technology.sections) {
         text += sectionOf(technology, section);

@@ -9,17 +9,16 @@ namespace pallax {
 namespace {
 
 constexpr std::string_view kDescription = R"(.SH DESCRIPTION
-The display of a radio modem is made of sections, and a section of keys or of a list whose entries
-have keys.
-This page tells, for each technology, which log codes fill a section, where in the log record each key
-stands, how it is shown, and what it means.
+The display of a radio modem consists of sections; a section has keys, or a list of entries with keys.
+For each technology, this page lists the log codes that fill a section, the position of each key in
+the log record, how it is shown, and what it means.
 .PP
-A record is counted from its log type, byte 0, so that its body begins at byte 13; an entry of a list
-and a subpacket are counted from their own first byte.
-Numbers are unsigned and little\-endian unless it says otherwise; bit 0 is the lowest of a byte.
-\(lqraw\(rq is the number as it stands in the record; what stands in quotes is a label, or a format of
+Bytes of a log record are counted from its log type, byte 0, so the body begins at byte 13.
+Bytes of an entry or a subpacket are counted from its own first byte.
+Numbers are unsigned and little\-endian unless noted otherwise; bit 0 is the lowest of a byte.
+\(lqraw\(rq is the number in the log record; quoted texts are labels or formats of
 .BR printf (3).
-Bytes beyond the end of a record read as zero, and a list ends at the first entry that is not whole.
+Bytes past the end of a log record read as zero, and a list ends at the first incomplete entry.
 )";
 
 /// ", 9 bits from bit 1" of "9 from bit 1"
@@ -81,15 +80,16 @@ std::string headingOf(const TechnologyReference& technology) {
 std::string sectionsPage(std::span<const TechnologyReference> technologies) {
     std::string text(".\\\" Written by make_reference.\n"
                      ".TH PALLAX\\-SECTIONS 7 " PALLAX_DATE " \"pallax " PALLAX_VERSION
-                     "\" Pallax\n.SH NAME\npallax\\-sections \\- the sections of the display, and "
-                     "what they are read from\n");
+                     "\" Pallax\n.SH NAME\npallax\\-sections \\- the sections of the display and "
+                     "their log records\n");
     text.append(kDescription);
     for (const TechnologyReference& technology : technologies) {
         text += headingOf(technology);
         if (technology.technology->commandName == "ifx") {
-            text += "An IFX modem sends no log records: the display is whatever comes.\nThese "
-                    "sections and keys are known to come; every value is a text as the modem gives "
-                    "it.\n";
+            text +=
+                "An IFX modem sends no log records; each message holds the whole display.\nThese "
+                "are the known sections and keys; every value is a text as the modem sends "
+                "it.\n";
         }
         for (const SectionReference& section : technology.sections) {
             text += sectionOf(technology, section);

@@ -19,7 +19,7 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kIdentity, "System ID", "System identification (SID)."},
     {kIdentity, "Network ID", "Network identification (NID)."},
     {kIdentity, "Base Station ID", "Identity of the base station."},
-    {kIdentity, "Packet Zone ID", "Packet zone, whose change makes the phone set up packet data anew."},
+    {kIdentity, "Packet Zone ID", "Packet zone; when it changes, the phone sets up packet data again."},
     {kIdentity, "Protocol Revision", "Protocol revision of the base station."},
     {kIdentity, "Roaming Indicator", "Enhanced roaming indicator."},
 

@@ -11,7 +11,7 @@ constexpr std::string_view kContexts = "PDP Context Info";
 
 // clang-format off
 constexpr auto kMeanings = std::to_array<Meaning>({
-    {kSim, "", "Elementary files of the SIM, as the telephony service has read them."},
+    {kSim, "", "Elementary files of the SIM, as read by the telephony service."},
     {kSim, "EF-ICCID", "Identity of the card."},
     {kSim, "EF-MSISDN", "The subscriber's own number."},
     {kSim, "EF-3GPP MAIL BOX DIALING NUMBER", "Number of the voice mailbox."},
@@ -24,10 +24,10 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kSim, "EF-ACTING HPLMN", "Network that counts as the home network."},
     {kSim, "EF-RAT MODE", "Radio access technologies that the card prefers."},
     {kSim, "EF-PLMN NETWORK NAME", "Names of networks."},
-    {kSim, "EF-OPERATOR PLMN LIST", "For which networks and areas the names of EF-PNN hold."},
+    {kSim, "EF-OPERATOR PLMN LIST", "Networks and areas to which the names in EF-PNN apply."},
     {kSim, "EF-OPLMNAcT", "Networks that the operator prefers, with their access technologies."},
 
-    {kContexts, "", "The contexts of packet data, each as the telephony service describes it."},
+    {kContexts, "", "The packet data contexts, each as the telephony service describes it."},
 });
 
 constexpr auto kCodeNames = std::to_array<CodeName>({

@@ -69,9 +69,9 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kRr, "RR Mode", "Whether the connection is for voice or for data."},
     {kRr, "Serving Rx Level", "Receive level of the serving cell, as the modem counts it."},
     {kRr, "Rx Quality Full", "Receive quality over all frames; the record holds C1 in the same place."},
-    {kRr, "Rx Quality Sub", "Receive quality over the frames that are sent in any case; the record holds C2 in the same place."},
+    {kRr, "Rx Quality Sub", "Receive quality over the frames that are always sent; the record holds C2 in the same place."},
     {kRr, "DTX Used", "Whether discontinuous transmission is in use."},
-    {kRr, "DRX Used", "Discontinuous reception: the time for which the phone goes on listening."},
+    {kRr, "DRX Used", "Discontinuous reception: how long the phone keeps listening."},
 
     {kNeighbors, "", "The GSM neighbours."},
     {kNeighbors, "ARFCN", "ARFCN of the neighbour's BCCH carrier."},
@@ -84,7 +84,7 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kAllocation, "ARFCNs", "ARFCNs that the channel hops over."},
 
     {kGprs, "", "Packet-data parameters that the GSM serving cell broadcasts."},
-    {kGprs, "Network Control Order", "Who decides about reselection: NC0 the phone, NC1 the phone with reports, NC2 the network."},
+    {kGprs, "Network Control Order", "Who decides on reselection: NC0 the phone, NC1 the phone with reports, NC2 the network."},
     {kGprs, "PFC Supported", "Whether the network supports packet flow contexts."},
     {kGprs, "Priority Access Threshold", "Radio priorities whose packet access is allowed."},
     {kGprs, "Network Operating Mode", "Network mode of operation: how paging of both domains is coordinated."},
@@ -95,8 +95,8 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kGprs, "Ext Measurement Order", "Extended measurement order of the network, as a number."},
     {kGprs, "Packet PSI Status", "Whether the network supports the packet PSI status message, as a number."},
     {kGprs, "Packet SI Status", "Whether the network supports the packet SI status message."},
-    {kGprs, "Count LR", "A count of the record: it gives no more than the name."},
-    {kGprs, "Count HR", "A count of the record: it gives no more than the name."},
+    {kGprs, "Count LR", "A count of the record: it gives only the name."},
+    {kGprs, "Count HR", "A count of the record: it gives only the name."},
     {kGprs, "SI13 Position", "On which channel system information 13 is sent."},
     {kGprs, "Cell Reselect Hysteresis", "Whether the reselection hysteresis is applied."},
 
@@ -118,14 +118,14 @@ constexpr auto kMeanings = std::to_array<Meaning>({
 
     {kActive, "", "The UMTS cells that the phone is connected through."},
     {kActive, "Scrambling Code", "Primary scrambling code of the cell."},
-    {kActive, "RSCP", "Received signal code power of the cell's pilot, worked out of receiver gain and Ec/Io."},
+    {kActive, "RSCP", "Received signal code power of the cell's pilot, computed from receiver gain and Ec/Io."},
     {kActive, "Energy Per Chip", "Ec/Io of the cell's pilot: energy per chip over the whole received power."},
 
-    {"Monitored Set", "", "The UMTS cells that the network lets the phone measure; the list is always empty."},
+    {"Monitored Set", "", "The UMTS cells that the network tells the phone to measure; the list is always empty."},
     {"Detected Set", "", "The UMTS cells that the phone has found by itself; the list is always empty."},
     {"Virtual Active Set", "", "The active set on a frequency that the phone is not on; the list is always empty."},
 
-    {kUmtsSet, "", "The UMTS neighbours: ranked for reselection, or of the cell monitor, whichever came last."},
+    {kUmtsSet, "", "The UMTS neighbours: ranked for reselection, or from the cell monitor, whichever came last."},
     {kUmtsSet, "Scrambling Code", "Primary scrambling code of the cell."},
     {kUmtsSet, "RSCP", "Received signal code power of the cell's pilot."},
     {kUmtsSet, "Energy Per Chip", "Ec/No of the cell's pilot: energy per chip over noise."},

@@ -29,7 +29,7 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kServing, "LAC", "Code of the location area that the cell belongs to."},
     {kServing, "Cell ID", "Identity of the cell in its location area."},
 
-    {kNeighbours, "", "The neighbours; one whose identity code is not read is nothing but its ARFCN."},
+    {kNeighbours, "", "The neighbours; an entry whose identity code has not been read is only the ARFCN."},
     {kNeighbours, "ARFCN", "ARFCN of the neighbour's BCCH carrier."},
     {kNeighbours, "BSIC", "Base station identity code: network colour code, base station colour code."},
     {kNeighbours, "Rx Level", "Receive level of the neighbour."},
@@ -39,7 +39,7 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kDedicated, "Time Slot", "Time slot of the channel, 0 to 7."},
     {kDedicated, "Timing Advance", "Timing advance, in bit periods."},
     {kDedicated, "Rx Quality", "Receive quality, 0 (best) to 7."},
-    {kDedicated, "Tx Power", "Power that the phone sends with."},
+    {kDedicated, "Tx Power", "Transmit power of the phone."},
     {kDedicated, "Hopping", "ARFCNs that the channel hops over."},
 
     {"Barred Cells", "", "ARFCNs of barred cells."},

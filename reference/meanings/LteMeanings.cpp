@@ -48,7 +48,7 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kServingMeasurements, "S Intra Search", "Srxlev below which cells of the same frequency are measured."},
     {kServingMeasurements, "S Non Intra Search", "Srxlev below which other frequencies and technologies are measured."},
     {kServingMeasurements, "Measurement Rules Updated", "Whether the measurement rules have changed."},
-    {kServingMeasurements, "Measurement Rules", "Number of the measurement rules that are in force; no meaning of the single values is known."},
+    {kServingMeasurements, "Measurement Rules", "Number of the measurement rules that are in force; the meaning of the values is not known."},
 
     {kConnected, "", "The serving cell in connected mode."},
     {kConnected, "E-ARFCN", "EARFCN of the measured frequency, which is the serving one."},
@@ -81,10 +81,10 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kNeighborCells, "Frequency Offset", "Frequency offset of the neighbour, as the modem counts it; its unit is not known."},
     {kNeighborCells, "Ant 0 Frame Offset", "Frame timing of the neighbour at antenna 0, as the modem counts it."},
     {kNeighborCells, "Ant 0 Sample Offset", "Sample timing of the neighbour at antenna 0, as the modem counts it."},
-    {kNeighborCells, "Ant 1 Frame Offset", "Frame timing of antenna 0 once more."},
-    {kNeighborCells, "Ant 1 Sample Offset", "Sample timing of antenna 0 once more."},
+    {kNeighborCells, "Ant 1 Frame Offset", "Frame timing of antenna 0 again."},
+    {kNeighborCells, "Ant 1 Sample Offset", "Sample timing of antenna 0 again."},
 
-    {kCandidates, "", "From where the phone looks for a cell to reselect."},
+    {kCandidates, "", "The serving cell from which the phone may reselect."},
     {kCandidates, "Version", "Version of the log record's layout."},
     {kCandidates, "Serving EARFCN", "EARFCN of the serving cell's downlink."},
     {kCandidates, "Serving Cell ID", "Physical cell identity of the serving cell."},

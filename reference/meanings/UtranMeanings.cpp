@@ -19,7 +19,7 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kRrc, "State", "State of the RRC connection."},
 
     {kServing, "", "Identity, carrier and access rules of the serving cell."},
-    {kServing, "Cell Access Restrictions", "Access restrictions of the cell, as one number; no meaning of the single values is known."},
+    {kServing, "Cell Access Restrictions", "Access restrictions of the cell, as one number; the meaning of the values is not known."},
     {kServing, "Cell ID", "Identity of the serving cell."},
     {kServing, "Downlink UARFCN", "UARFCN of the downlink carrier."},
     {kServing, "Uplink UARFCN", "UARFCN of the uplink carrier."},
@@ -29,16 +29,16 @@ constexpr auto kMeanings = std::to_array<Meaning>({
     {kServing, "Freq Band Indicator", "Number of the operating band."},
     {kServing, "Cell Scrambling Code", "Scrambling code of the serving cell."},
 
-    {kNeighbors, "", "The neighbours of UTRAN."},
+    {kNeighbors, "", "The UTRAN neighbours."},
     {kNeighbors, "UARFCN", "UARFCN of the neighbour."},
-    {kNeighbors, "Cell ID", "Identity by which the modem tells the neighbour, 7 bits; not the network's cell identity."},
+    {kNeighbors, "Cell ID", "Identity of the neighbour for the modem, 7 bits; not the network's cell identity."},
     {kNeighbors, "Filter RSCP", "Received signal code power after the filter, as the modem counts it; its unit is not known."},
     {kNeighbors, "Status", "Set that the cell belongs to: active (ASET), monitored (MSET) or detected (DSET)."},
-    {kNeighbors, "inJDCS", "Whether the cell is in the JDCS; the record gives no more than the name."},
+    {kNeighbors, "inJDCS", "Whether the cell is in the JDCS; the record gives only the name."},
 
-    {kGsmNeighbors, "", "The neighbours of GSM; they are read and kept from the display, so that the list stays empty."},
+    {kGsmNeighbors, "", "The GSM neighbours; they are read but not displayed, so the list stays empty."},
     {kGsmNeighbors, "Cell ID", "Number of the neighbour in the record, 14 bits."},
-    {kGsmNeighbors, "Band Indicator", "Which of the bands with the same channel numbers the ARFCN is of."},
+    {kGsmNeighbors, "Band Indicator", "Band of the ARFCN, where bands share channel numbers."},
     {kGsmNeighbors, "BSIC Valid", "Whether the base station identity code has been read."},
     {kGsmNeighbors, "NCC", "Network colour code."},
     {kGsmNeighbors, "BCC", "Base station colour code."},
@@ -51,7 +51,7 @@ constexpr auto kMeanings = std::to_array<Meaning>({
 
     {kSir, "", "Signal-to-interference ratios of the coded composite transport channels."},
     {kSir, "CCTRCH ID", "Identity of the coded composite transport channel."},
-    {kSir, "TSNUM", "Number of time slots, or of the time slot: the record gives no more than the name."},
+    {kSir, "TSNUM", "Number of time slots, or of the time slot: the record gives only the name."},
     {kSir, "SIR", "Six signal-to-interference ratios, as the modem counts them."},
 });
 
