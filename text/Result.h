@@ -7,7 +7,7 @@ namespace pallax {
 
 /// A value, or why there is none. Value and error must be different types.
 template <class Value, class Error>
-class Result {
+class [[nodiscard]] Result {
 public:
     Result(Value value) : _content(std::in_place_index<0>, std::move(value)) {}
     Result(Error error) : _content(std::in_place_index<1>, std::move(error)) {}
