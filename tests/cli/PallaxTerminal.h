@@ -1,7 +1,7 @@
 #pragma once
 
 #include "tests/cli/PallaxProcess.h"
-#include "tests/cli/TerminalEmulator.h"
+#include "tests/cli/TerminalScreen.h"
 
 #include <functional>
 #include <string>
@@ -44,7 +44,7 @@ public:
     /// As PallaxProcess's; what is written until the end is read.
     int wait();
 
-    const TerminalEmulator& screen() const { return _screen; }
+    const TerminalScreen& screen() const { return _screen; }
     /// All bytes that came so far.
     const std::string& bytes() const { return _bytes; }
     /// Whether the terminal is as a shell leaves it: lines and echo, as at the start.
@@ -54,7 +54,7 @@ private:
     bool readFor(int milliseconds);
     bool waitUntil(const std::function<bool()>& condition, const std::string& wanted);
 
-    TerminalEmulator _screen;
+    TerminalScreen _screen;
     std::string _bytes;
     int _terminal = -1;
     pid_t _process = -1;

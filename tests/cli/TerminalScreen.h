@@ -1,0 +1,39 @@
+#pragma once
+
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vterm.h>
+
+namespace pallax::doubles {
+
+/// What a terminal of type xterm shows after the bytes that were written to it.
+class TerminalScreen {
+public:
+    TerminalScreen(int columns, int rows);
+    TerminalScreen(const TerminalScreen&) = delete; // the emulator keeps a pointer to it
+    TerminalScreen& operator=(const TerminalScreen&) = delete;
+
+    void write(std::string_view bytes);
+    /// The rows without the blanks at their ends, each with its line end.
+    std::string text() const;
+    bool isOnOtherScreen() const { return _isOnOtherScreen; }
+    /// The escape and control sequences that the terminal did not understand.
+    const std::string& unknown() const { return _unknown; }
+    void resize(int columns, int rows);
+
+private:
+    struct Free {
+        void operator()(VTerm* terminal) const { vterm_free(terminal); }
+    };
+    using Terminal = std::unique_ptr<VTerm, Free>;
+
+    Terminal _terminal;
+    Terminal
+        _escapes; ///< a parser alone, for the terminal reports unknown escapes of one letter only
+    VTermScreen* _screen;
+    bool _isOnOtherScreen = false;
+    std::string _unknown;
+};
+
+} // namespace pallax::doubles
