@@ -202,7 +202,7 @@ void PallaxApp::reloadPanes() {
             _navController->popTo(index - 1, true);
             return;
         }
-        pane.reloadWithNode(std::move(node));
+        pane.reloadWithNode(std::move(node), _surroundings.clock.now());
     }
 }
 

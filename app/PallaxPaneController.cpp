@@ -4,15 +4,12 @@
 #include "platform/ui/NavigationStack.h"
 #include "platform/ui/Toolkit.h"
 
-#include <algorithm>
 #include <utility>
-#include <vector>
 
 namespace pallax {
 
 namespace {
 
-constexpr std::string_view kTitleWithoutNode = "Pallax";
 constexpr const char* kPaneCellIdentifier = "PallaxPaneControllerCell";
 constexpr ui::Font kStatusFont{ui::FontFace::System, 14};
 
@@ -24,23 +21,6 @@ ui::Label statusLabel(const std::string& status, const ui::TextMetrics& metrics)
     label.color = ui::TextColor::Dark;
     label.frame.size = metrics.measure(status, kStatusFont);
     return label;
-}
-
-/// True for the names that the tree gives the elements of an array.
-bool areNumbered(const std::vector<NodeRef>& children) {
-    std::size_t expected = 0;
-    return std::all_of(children.begin(), children.end(), [&expected](const NodeRef& child) {
-        return child->displayName() == std::to_string(expected++);
-    });
-}
-
-/// The text of a leaf's value; a branch, which has none, shows nothing.
-std::string valueText(const PallaxModelNode& node) {
-    std::string text;
-    if (const PropertyList* value = node.value()) {
-        value->appendString(text);
-    }
-    return text;
 }
 
 /// A label that the cell does not have takes no text.
@@ -59,24 +39,20 @@ std::shared_ptr<PallaxCell> reusableCell(ui::TableView& table) {
 
 PallaxPaneController::PallaxPaneController(ui::Toolkit& toolkit, PaneApplication& application,
                                            NodeRef node, std::string path)
-    : TableScreen(toolkit), _toolkit(toolkit), _application(application), _nodes(std::move(node)),
-      _keyPath(std::move(path)) {}
+    : TableScreen(toolkit), _toolkit(toolkit), _application(application),
+      _pane(std::move(node), std::move(path)) {}
 
 void PallaxPaneController::createToolbarItems() {
     ui::ActivityIndicator indicator;
     indicator.style = ui::IndicatorStyle::Gray;
     indicator.hidesWhenStopped = true;
-    indicator.isSpinning = _isLoading;
-    ui::BarItems items = {indicator, statusLabel(_status, _toolkit.textMetrics()),
+    indicator.isSpinning = _pane.isLoading();
+    ui::BarItems items = {indicator, statusLabel(_pane.status(), _toolkit.textMetrics()),
                           ui::FlexibleSpace{}};
     if (_application.allowSaveButton()) {
         items.emplace_back(ui::SaveButton{[&app = _application] { app.showSaveView(); }});
     }
     setToolbarItems(std::move(items), true);
-}
-
-void PallaxPaneController::showTitle() {
-    setTitle(_nodes ? _nodes->displayName() : std::string(kTitleWithoutNode));
 }
 
 void PallaxPaneController::viewWillAppear(bool animated) {
@@ -93,32 +69,23 @@ void PallaxPaneController::viewWillDisappear(bool /*animated*/) {
 }
 
 void PallaxPaneController::setStatus(std::optional<std::string> status, bool isLoading) {
-    _status = std::move(status).value_or("");
-    _isLoading = isLoading;
+    _pane.setStatus(std::move(status).value_or(""), isLoading);
     createToolbarItems();
 }
 
-void PallaxPaneController::reloadWithNode(NodeRef node) {
-    if (node != _nodes) { // the same node again is no new data: what has changed stays so
-        _previousByName.clear();
-        _previousNodes = std::exchange(_nodes, std::move(node));
-    }
+void PallaxPaneController::reloadWithNode(NodeRef node, std::optional<Time> time) {
+    _pane.show(std::move(node), time);
     showTitle();
     table().reloadData();
     createToolbarItems();
 }
 
 std::size_t PallaxPaneController::numberOfRows() const {
-    const std::vector<NodeRef>* children = _nodes ? _nodes->childNodes() : nullptr;
-    return children != nullptr ? children->size() : 0;
-}
-
-NodeRef PallaxPaneController::childAt(std::size_t row) const {
-    return row < numberOfRows() ? (*_nodes->childNodes())[row] : nullptr;
+    return _pane.totalRows();
 }
 
 std::shared_ptr<ui::TableCell> PallaxPaneController::cellForRow(std::size_t row) {
-    const NodeRef child = childAt(row);
+    const NodeRef child = _pane.nodeAt(row);
     if (!child) {
         return nullptr;
     }
@@ -131,7 +98,7 @@ std::shared_ptr<ui::TableCell> PallaxPaneController::cellForRow(std::size_t row)
     }
     setText(cell->key(), child->displayName());
     cell->setAccessory(isBranch ? ui::CellAccessory::DisclosureIndicator : ui::CellAccessory::None);
-    setText(cell->value(), valueText(*child));
+    setText(cell->value(), textOf(*child).value_or(""));
     if (isBranch) {
         cell->setLayoutKey();
     } else {
@@ -141,55 +108,13 @@ std::shared_ptr<ui::TableCell> PallaxPaneController::cellForRow(std::size_t row)
 }
 
 ui::RowText PallaxPaneController::textOfRow(std::size_t row) const {
-    ui::RowText text;
-    const NodeRef child = childAt(row);
-    if (!child) {
-        return text;
-    }
-    text.name = child->displayName();
-    if (const std::vector<NodeRef>* children = child->childNodes()) {
-        text.isBranch = true;
-        if (!children->empty() && areNumbered(*children)) {
-            text.elements = children->size();
-        }
-        return text;
-    }
-    text.value = valueText(*child);
-    text.hasChanged = hasChanged(*child, row);
-    return text;
-}
-
-bool PallaxPaneController::hasChanged(const PallaxModelNode& leaf, std::size_t row) const {
-    if (!_previousNodes) {
-        return false;
-    }
-    const PallaxModelNode* previous = previousNamed(leaf.displayName(), row);
-    const PropertyList* before = previous != nullptr ? previous->value() : nullptr;
-    const PropertyList* now = leaf.value();
-    return before == nullptr || now == nullptr || !(*before == *now);
-}
-
-const PallaxModelNode* PallaxPaneController::previousNamed(std::string_view name,
-                                                           std::size_t row) const {
-    const std::vector<NodeRef>* children = _previousNodes->childNodes();
-    if (children == nullptr) {
-        return nullptr;
-    }
-    if (row < children->size() && (*children)[row]->displayName() == name) {
-        return (*children)[row].get();
-    }
-    if (_previousByName.empty()) {
-        _previousByName.reserve(children->size());
-        for (const NodeRef& child : *children) {
-            _previousByName.insert_or_assign(child->displayName(), child.get());
-        }
-    }
-    const auto found = _previousByName.find(name);
-    return found != _previousByName.end() ? found->second : nullptr;
+    PaneRow made = _pane.row(row);
+    return {std::move(made.name), std::move(made.text), made.elements, made.isBranch,
+            made.hasChanged};
 }
 
 void PallaxPaneController::didSelectRow(std::optional<std::size_t> row) {
-    const NodeRef child = row ? childAt(*row) : nullptr;
+    const NodeRef child = row ? _pane.nodeAt(*row) : nullptr;
     if (!child) {
         return;
     }
@@ -198,8 +123,8 @@ void PallaxPaneController::didSelectRow(std::optional<std::size_t> row) {
         return;
     }
     auto pane = std::make_shared<PallaxPaneController>(_toolkit, _application, child,
-                                                       childPath(_keyPath, child->displayName()));
-    pane->setStatus(_status, _isLoading);
+                                                       childPath(path(), child->displayName()));
+    pane->setStatus(_pane.status(), _pane.isLoading());
     if (ui::NavigationStack* stack = _application.navigationController()) {
         stack->push(std::move(pane), true);
     }

@@ -1,10 +1,12 @@
 #pragma once
 
 #include "plist/PropertyList.h"
+#include "text/Date.h"
 
 #include <cstddef>
 #include <memory>
 #include <memory_resource>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -72,6 +74,9 @@ public:
     /// The value of a leaf: a string or display number (which knows its number and unit); null
     /// for a branch. Valid as long as the node.
     virtual const PropertyList* value() const { return nullptr; }
+    /// When a packet last gave the value of a leaf, the same one as before or another. Nothing for
+    /// a branch, and where the display does not keep it.
+    virtual std::optional<Time> readAt() const { return std::nullopt; }
 
     /// Builds the tree of a display object; its root is named "Pallax" and has the path "/".
     /// Fills `pathDictionary` (empty before) with every node; of two nodes with one path it keeps

@@ -2,6 +2,7 @@
 
 #include "app/PallaxCell.h"
 #include "app/PallaxPaneController.h"
+#include "tests/app/pane/PaneNodes.h"
 #include "tests/doubles/FakeToolkit.h"
 
 #include <gtest/gtest.h>
@@ -23,13 +24,6 @@ public:
     void showSaveView() override { ++saveViewsAsked; }
     ui::NavigationStack* navigationController() override { return stack.get(); }
 };
-
-inline NodeRef leafNode(std::string name, PropertyList value) {
-    return std::make_shared<PallaxModelLeafNode>(std::move(name), std::move(value));
-}
-inline NodeRef treeNode(std::string name, std::vector<NodeRef> children) {
-    return std::make_shared<PallaxModelTreeNode>(std::move(name), std::move(children));
-}
 
 /// Panes in a fake toolkit, without a model.
 class PaneFixture : public testing::Test {
