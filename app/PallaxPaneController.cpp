@@ -107,12 +107,6 @@ std::shared_ptr<ui::TableCell> PallaxPaneController::cellForRow(std::size_t row)
     return cell;
 }
 
-ui::RowText PallaxPaneController::textOfRow(std::size_t row) const {
-    PaneRow made = _pane.row(row);
-    return {std::move(made.name), std::move(made.text), made.elements, made.isBranch,
-            made.hasChanged};
-}
-
 void PallaxPaneController::didSelectRow(std::optional<std::size_t> row) {
     const NodeRef child = row ? _pane.nodeAt(*row) : nullptr;
     if (!child) {

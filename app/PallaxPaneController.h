@@ -51,7 +51,6 @@ public:
 
     std::size_t numberOfRows() const override;
     std::shared_ptr<ui::TableCell> cellForRow(std::size_t row) override;
-    ui::RowText textOfRow(std::size_t row) const override;
     void didSelectRow(std::optional<std::size_t> row) override;
 
 private:

@@ -8,6 +8,7 @@
 #include "text/Format.h"
 
 #include <utility>
+#include <vector>
 
 namespace pallax {
 
@@ -18,12 +19,33 @@ constexpr const char* kSaveCellIdentifier = "SaveHistoryContentCell";
 constexpr ui::Font kItemFont{ui::FontFace::Helvetica, 13};
 constexpr std::string_view kDescriptionKey = "Description";
 
+/// The entry's "Description"; empty where it has none.
+std::string descriptionOf(const PropertyList& entry) {
+    std::string text;
+    const DictionaryRef item = entry.dictionary();
+    if (const PropertyList* description = item ? item->find(kDescriptionKey) : nullptr) {
+        description->appendString(text);
+    }
+    return text;
+}
+
+NodeRef itemsOf(const PropertyList& saveHistory) {
+    std::vector<NodeRef> items;
+    if (const ArrayRef entries = saveHistory.array()) {
+        for (const PropertyList& entry : *entries) {
+            items.push_back(std::make_shared<PallaxModelNode>(descriptionOf(entry)));
+        }
+    }
+    return std::make_shared<PallaxModelTreeNode>(std::string(), std::move(items));
+}
+
 } // namespace
 
 PallaxSaveViewController::PallaxSaveViewController(Surroundings surroundings,
                                                    const PropertyList& saveHistory)
     : ModalScreen(surroundings.toolkit, kLayoutName), _surroundings(std::move(surroundings)),
-      _timeStamp(dateOf(_surroundings.clock.now())), _saveHistory(saveHistory.shallowCopy()) {}
+      _timeStamp(dateOf(_surroundings.clock.now())), _saveHistory(saveHistory.shallowCopy()),
+      _items(itemsOf(_saveHistory), "") {}
 
 Dictionary PallaxSaveViewController::snapshot(const PropertyList& timestamp,
                                               const PropertyList& data,
@@ -91,20 +113,7 @@ bool PallaxSaveViewController::textFieldShouldReturn(ui::TextField& field) {
 }
 
 std::size_t PallaxSaveViewController::numberOfRows() const {
-    const ArrayRef items = _saveHistory.array();
-    return items ? items->size() : 0;
-}
-
-std::string PallaxSaveViewController::descriptionOf(std::size_t row) const {
-    std::string text;
-    if (row < numberOfRows()) {
-        const DictionaryRef item = (*_saveHistory.array())[row].dictionary();
-        const PropertyList* description = item ? item->find(kDescriptionKey) : nullptr;
-        if (description != nullptr) {
-            description->appendString(text);
-        }
-    }
-    return text;
+    return _items.totalRows();
 }
 
 std::shared_ptr<ui::TableCell> PallaxSaveViewController::cellForRow(std::size_t row) {
@@ -114,16 +123,10 @@ std::shared_ptr<ui::TableCell> PallaxSaveViewController::cellForRow(std::size_t 
         cell = std::make_shared<ui::TableCell>(ui::CellStyle::Plain, kSaveCellIdentifier);
         cell->setContentBounds(saveContentTable().contentBounds());
     }
-    cell->textLabel().text = descriptionOf(row);
+    cell->textLabel().text = _items.row(row).name;
     cell->textLabel().font = kItemFont;
     cell->setAccessory(ui::CellAccessory::Checkmark);
     return cell;
-}
-
-ui::RowText PallaxSaveViewController::textOfRow(std::size_t row) const {
-    ui::RowText text;
-    text.name = descriptionOf(row);
-    return text;
 }
 
 void PallaxSaveViewController::didSelectRow(std::optional<std::size_t> /*row*/) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "app/pane/PaneModel.h"
 #include "platform/ui/ModalScreen.h"
 #include "plist/PropertyList.h"
 #include "text/Date.h"
@@ -19,7 +20,7 @@ class MainQueue;
 
 /// The snapshot screen: lists what will be saved and writes it, with a description, as one
 /// property-list file. Its items and its time stamp are those of its creation.
-class PallaxSaveViewController final : public ui::ModalScreen {
+class PallaxSaveViewController final : public ui::ModalScreen, public PaneOwner {
 public:
     /// All that is referred to outlives the screen.
     struct Surroundings {
@@ -60,18 +61,18 @@ public:
 
     std::size_t numberOfRows() const override;
     std::shared_ptr<ui::TableCell> cellForRow(std::size_t row) override;
-    ui::RowText textOfRow(std::size_t row) const override;
     void didSelectRow(std::optional<std::size_t> row) override;
+    /// The items, named by their descriptions; they have no values.
+    PaneModel& pane() override { return _items; }
 
 private:
-    /// The entry's "Description"; empty where it has none.
-    std::string descriptionOf(std::size_t row) const;
     std::string snapshotPath() const;
     void reportFailure(const std::string& path);
 
     Surroundings _surroundings;
     Date _timeStamp;
     PropertyList _saveHistory;
+    PaneModel _items;
 };
 
 } // namespace pallax

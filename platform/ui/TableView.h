@@ -46,7 +46,8 @@ public:
     Label& textLabel() { return _textLabel; }
     const Label& textLabel() const { return _textLabel; }
 
-    /// The content area, as the front end gives it.
+    /// The content area, which a cell is laid out in: the table's when the cell was made. A front
+    /// end that hands out a spare cell sets it first.
     const Rect& contentBounds() const { return _contentBounds; }
     void setContentBounds(const Rect& bounds) { _contentBounds = bounds; }
 
@@ -64,17 +65,6 @@ private:
     Rect _contentBounds;
 };
 
-/// A row in words, for what a front end does beyond drawing it: searching, comparing, copying,
-/// reading aloud.
-struct RowText {
-    std::string name;
-    std::optional<std::string> value;    ///< of a leaf
-    std::optional<std::size_t> elements; ///< of a branch that is a list: how many
-    bool isBranch = false;
-    /// A leaf whose value is not what it was before the table was last reloaded with new data.
-    bool hasChanged = false;
-};
-
 /// What a table shows: one section of rows. The table asks only for the rows it needs.
 class TableSource {
 public:
@@ -82,7 +72,6 @@ public:
     virtual std::size_t numberOfRows() const = 0;
     /// `row` is below numberOfRows().
     virtual std::shared_ptr<TableCell> cellForRow(std::size_t row) = 0;
-    virtual RowText textOfRow(std::size_t row) const = 0;
     virtual void didSelectRow(std::optional<std::size_t> row) = 0;
 };
 
@@ -90,9 +79,12 @@ public:
 class TableView {
 public:
     virtual ~TableView() = default;
-    /// A cell with this identifier that has left the screen, or null.
+    /// A cell with this identifier that has left the screen, or null. The source fills it and lays
+    /// it out in the content area that it has.
     virtual std::shared_ptr<TableCell> dequeueReusableCell(std::string_view identifier) = 0;
-    /// The content area a new cell gets.
+    /// The content area a new cell gets. It is the same for every accessory, which is drawn outside
+    /// it. When the width changes, a front end asks the source for the cells again: a cell that it
+    /// has is not laid out anew.
     virtual Rect contentBounds() const = 0;
     virtual void reloadData() = 0;
     virtual void deselectRow(std::size_t row, bool animated) = 0;

@@ -105,7 +105,7 @@ protected:
     void openRow(const std::string& name) {
         PallaxPaneController& current = top();
         for (std::size_t row = 0; row < current.numberOfRows(); ++row) {
-            if (current.textOfRow(row).name == name) {
+            if (current.pane().row(row).name == name) {
                 return current.didSelectRow(row);
             }
         }
@@ -121,11 +121,11 @@ protected:
         return screen.toolbarItems().size() > 3 &&
                std::holds_alternative<ui::SaveButton>(screen.toolbarItems()[3]);
     }
-    static std::string rowsOf(const PallaxPaneController& shown) {
+    static std::string rowsOf(PallaxPaneController& shown) {
         std::string rows;
         for (std::size_t row = 0; row < shown.numberOfRows(); ++row) {
-            const ui::RowText text = shown.textOfRow(row);
-            rows += (row == 0 ? "" : " ") + text.name + (text.value ? "=" + *text.value : "");
+            const PaneRow text = shown.pane().row(row);
+            rows += (row == 0 ? "" : " ") + text.name + (text.text ? "=" + *text.text : "");
         }
         return rows;
     }

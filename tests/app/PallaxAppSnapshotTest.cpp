@@ -96,7 +96,8 @@ TEST_F(SaveViewTest, ShowSaveViewPresentsTheModelsSaveContentsModallyAndAnimated
                                            "screen 2 didLoad", "list sizeToFit",
                                            "screen 2 setFrame (0 20 320 460)"}));
     ASSERT_EQ(app->saveViewController()->numberOfRows(), 1U);
-    EXPECT_EQ(app->saveViewController()->textOfRow(0).name, "Snapshot (2023-11-14 22:13:22 +0000)");
+    EXPECT_EQ(app->saveViewController()->pane().row(0).name,
+              "Snapshot (2023-11-14 22:13:22 +0000)");
 }
 
 TEST_F(SaveViewTest, PressingSaveTwiceQuicklyOpensOneSnapshotScreen) {

@@ -57,7 +57,8 @@ TEST_F(PallaxAppUpdateTest, EveryPaneIsReloadedFromTheBottomUpwards) {
     EXPECT_LT(at("table 2 reloadData"), at("table 3 reloadData"));
     EXPECT_LT(at("table 3 reloadData"), static_cast<std::ptrdiff_t>(diary.size()));
     EXPECT_EQ(rowsOf(pane(2)), "Power=2");
-    EXPECT_TRUE(pane(2).textOfRow(0).hasChanged);
+    EXPECT_TRUE(pane(2).pane().row(0).hasChanged);
+    EXPECT_EQ(pane(2).pane().row(0).changedAt, clock.now());
     EXPECT_EQ(depth(), 3U);
 }
 

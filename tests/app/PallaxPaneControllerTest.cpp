@@ -130,7 +130,7 @@ TEST_F(PallaxPaneControllerTest, APaneWithoutANodeHasNoRowsAndTheTitlePallax) {
     EXPECT_EQ(pane->title(), "Pallax");
     EXPECT_EQ(pane->numberOfRows(), 0U);
     EXPECT_EQ(pane->cellForRow(0), nullptr);
-    EXPECT_EQ(pane->textOfRow(0).name, "");
+    EXPECT_EQ(pane->pane().row(0).name, "");
 }
 
 TEST_F(PallaxPaneControllerTest, ANodeWithoutChildrenGivesNoRows) {

@@ -139,9 +139,9 @@ TEST_F(PallaxSaveViewControllerTest, ACellIsReused) {
 
 TEST_F(PallaxSaveViewControllerTest, ARowInWordsIsItsDescription) {
     const auto made = open(two);
-    const ui::RowText text = made->textOfRow(0);
+    const PaneRow text = made->pane().row(0);
     EXPECT_EQ(text.name, "Snapshot (one)");
-    EXPECT_EQ(text.value, std::nullopt);
+    EXPECT_EQ(text.text, std::nullopt);
     EXPECT_FALSE(text.isBranch);
     EXPECT_FALSE(text.hasChanged);
 }
@@ -238,7 +238,7 @@ TEST_F(PallaxSaveViewControllerTest, ItemsAndTimestampAreThoseOfTheCreation) {
     clock.advance(1h);
     present.advance(70s);
     EXPECT_EQ(made->numberOfRows(), 2U);
-    EXPECT_EQ(made->textOfRow(0).name, "Snapshot (one)");
+    EXPECT_EQ(made->pane().row(0).name, "Snapshot (one)");
     made->savePressed();
     const DictionaryRef root =
         files.files.at("/var/mobile/Library/Logs/Faultbox/PallaxSnapshot-1700000070.pallax")

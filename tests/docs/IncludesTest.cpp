@@ -51,7 +51,7 @@ const std::vector<Layer>& layers() {
         {"monitor", {"text", "plist", "platform", generators, "app/tree"}},
         {"app", {"text", "plist", "platform", "platform/ui", "app/tree", "app/pane", "monitor"}},
         {"host", {"text", "plist", "platform", "timeline"}},
-        {"ui/terminal", {"text", "plist", "platform", "platform/ui"}},
+        {"ui/terminal", {"text", "plist", "platform", "platform/ui", "app/tree", "app/pane"}},
         {"simulator", {"text", "plist", "platform", "timeline", "host"}},
         {"telephony",
          {"text", "plist", "platform", "timeline", records, generators, "host", "simulator"}},

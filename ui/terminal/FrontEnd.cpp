@@ -301,7 +301,7 @@ void FrontEnd::openOrScroll(TerminalTable& table, bool mayScroll) {
     if (mayScroll && table.scrollSideways(kScrollColumns)) {
         return;
     }
-    if (const auto row = table.cursorRow()) {
+    if (const auto row = table.pane().cursorRow()) {
         table.source().didSelectRow(row);
     }
 }
@@ -313,7 +313,7 @@ void FrontEnd::goBack(TerminalTable& table) {
 }
 
 void FrontEnd::escape(TerminalTable& table) {
-    if (table.filter().empty()) {
+    if (table.pane().filter().empty()) {
         _toolkit.navigation()->back();
     } else {
         table.setFilter("");
@@ -334,17 +334,15 @@ void FrontEnd::save() {
 }
 
 void FrontEnd::copyValue(TerminalTable& table) {
-    if (const auto row = table.cursorRow()) {
-        const ui::RowText text = table.source().textOfRow(*row);
-        const std::string copied = text.value.value_or(text.name);
-        _surroundings.copy(copied);
-        setMessage("Copied: " + copied);
+    if (const auto copied = table.pane().copied()) {
+        _surroundings.copy(*copied);
+        setMessage("Copied: " + *copied);
     }
 }
 
 void FrontEnd::startFilter(TerminalTable& table) {
     LineEditor editor;
-    editor.setText(table.filter());
+    editor.setText(table.pane().filter());
     _filterEditor = std::move(editor);
     _filteredPane = _toolkit.navigation()->screens().back();
     needsDisplay();

@@ -1,5 +1,6 @@
 #include "ui/terminal/PaneView.h"
 
+#include "app/pane/FindIgnoringCase.h"
 #include "ui/terminal/LineEditor.h"
 #include "ui/terminal/TerminalToolkit.h"
 #include "ui/terminal/TextWidth.h"
@@ -108,9 +109,10 @@ void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
 void PaneView::drawTitle(TerminalNavigation& navigation, TerminalTable& table,
                          const Origin& origin) {
     int right = _grid.columns() - kMargin;
-    if (!table.filter().empty()) {
+    const PaneModel& pane = table.pane();
+    if (!pane.filter().empty()) {
         const std::string count =
-            std::to_string(table.shownRows()) + " of " + std::to_string(table.totalRows());
+            std::to_string(pane.shownRows()) + " of " + std::to_string(pane.totalRows());
         right -= columnsOf(count);
         _grid.put(right, kTitleRow, count, kDim);
         right -= 1;
@@ -184,23 +186,25 @@ int PaneView::drawLowerRule(const TerminalTable& table, std::size_t windowRows,
     const int row = _grid.rows() - kRowsBelowTable;
     _grid.fill({kMargin, _grid.columns() - kMargin}, row, _marks.horizontal, kDim);
     const std::size_t end = table.firstShown() + windowRows;
-    const std::size_t below = table.shownRows() - std::min(end, table.shownRows());
+    const std::size_t shown = table.pane().shownRows();
+    const std::size_t below = shown - std::min(end, shown);
     return drawHiddenRows(row, _marks.down, below, Key::PageDown, status);
 }
 
 void PaneView::drawRows(TerminalTable& table) {
     const int end = _grid.rows() - kRowsBelowTable;
     std::size_t shown = table.firstShown();
-    for (int y = kFirstTableRow; y < end && shown < table.shownRows(); ++y, ++shown) {
+    for (int y = kFirstTableRow; y < end && shown < table.pane().shownRows(); ++y, ++shown) {
         drawRow(table, shown, y);
     }
 }
 
 void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y) {
-    const std::size_t index = table.rowAt(shown);
+    const PaneModel& pane = table.pane();
+    const std::size_t index = pane.rowAt(shown);
     const std::shared_ptr<ui::TableCell> cell = table.source().cellForRow(index);
-    const ui::RowText row = table.source().textOfRow(index);
-    const bool isSelected = shown == table.cursor();
+    const PaneRow row = pane.row(index);
+    const bool isSelected = shown == pane.cursor();
     drawCell(table, *cell, row, y, isSelected);
     if (isSelected) {
         _grid.put(0, y, _marks.cursor, {.accent = true});
@@ -211,8 +215,8 @@ void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y) {
     });
 }
 
-void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const ui::RowText& row,
-                        int y, bool isSelected) {
+void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const PaneRow& row, int y,
+                        bool isSelected) {
     const ui::CellContents contents = cell.contents();
     const std::string count = row.elements ? std::to_string(*row.elements) : "";
     // A count stands at the end of the room for texts, behind a blank.
@@ -230,7 +234,7 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const u
                                   (row.hasChanged && label != contents.labels.front()),
                           .accent = isSelected};
         const int x = columnOf(label->frame.origin.x) - offset;
-        drawLabel(*label, x, y, style, {kMargin, width}, table.filter());
+        drawLabel(*label, x, y, style, {kMargin, width}, table.pane().filter());
         end = std::max(end, x + columnsOf(label->text));
     }
     if (end > width && width > 0) {
@@ -321,9 +325,9 @@ void PaneView::drawHints(const ui::BarItems& items, const TerminalTable& table, 
         return KeyEvent{.key = Key::Character, .character = key};
     };
     std::vector<std::pair<std::string_view, KeyEvent>> hints;
-    if (!table.filter().empty()) {
+    if (!table.pane().filter().empty()) {
         hints.emplace_back(kClearFilter, KeyEvent{.key = Key::Escape});
-    } else if (table.totalRows() > 0) {
+    } else if (table.pane().totalRows() > 0) {
         hints.emplace_back("/ filter", character(U'/'));
     }
     if (saveButtonOf(items) != nullptr) {

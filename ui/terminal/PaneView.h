@@ -53,7 +53,7 @@ private:
                        const PaneStatus& status);
     void drawRows(TerminalTable& table);
     void drawRow(TerminalTable& table, std::size_t shown, int y);
-    void drawCell(const TerminalTable& table, ui::TableCell& cell, const ui::RowText& row, int y,
+    void drawCell(const TerminalTable& table, ui::TableCell& cell, const PaneRow& row, int y,
                   bool isSelected);
     void drawLabel(const ui::Label& label, int x, int y, Style style, Span clip,
                    std::string_view filter);

@@ -7,27 +7,6 @@
 
 namespace pallax::terminal {
 
-namespace {
-
-constexpr char lowered(char letter) {
-    return letter >= 'A' && letter <= 'Z' ? static_cast<char>(letter - 'A' + 'a') : letter;
-}
-
-bool passes(const ui::RowText& row, std::string_view filter) {
-    return findIgnoringCase(row.name, filter) != std::string_view::npos ||
-           (row.value && findIgnoringCase(*row.value, filter) != std::string_view::npos);
-}
-
-} // namespace
-
-std::size_t findIgnoringCase(std::string_view text, std::string_view wanted) {
-    const auto found =
-        std::search(text.begin(), text.end(), wanted.begin(), wanted.end(),
-                    [](char left, char right) { return lowered(left) == lowered(right); });
-    return found == text.end() && !wanted.empty() ? std::string_view::npos
-                                                  : static_cast<std::size_t>(found - text.begin());
-}
-
 TerminalTable& terminalTable(ui::TableView& table) {
     return static_cast<TerminalTable&>(table);
 }
@@ -40,9 +19,20 @@ std::shared_ptr<ui::TableCell> TerminalTable::dequeueReusableCell(std::string_vi
     return nullptr;
 }
 
+PaneModel& TerminalTable::pane() const {
+    return dynamic_cast<PaneOwner&>(_source).pane();
+}
+
+std::optional<std::string> TerminalTable::cursorName() const {
+    const std::optional<std::size_t> row = pane().cursorRow();
+    return row ? std::optional(pane().nodeAt(*row)->displayName()) : std::nullopt;
+}
+
+/// A row that is scrolled sideways stays so as long as the cursor is on it.
 void TerminalTable::reloadData() {
-    filterRows();
-    findCursor();
+    if (_sidewaysOffset != 0 && cursorName() != _scrolledName) {
+        _sidewaysOffset = 0;
+    }
     keepCursorInWindow();
     _needsDisplay();
 }
@@ -52,7 +42,7 @@ void TerminalTable::deselectRow(std::size_t /*row*/, bool /*animated*/) {
 }
 
 void TerminalTable::sizeToFit() {
-    setViewport(totalRows(), _contentBounds);
+    setViewport(pane().totalRows(), _contentBounds);
 }
 
 void TerminalTable::setViewport(std::size_t rows, ui::Rect contentBounds) {
@@ -61,37 +51,17 @@ void TerminalTable::setViewport(std::size_t rows, ui::Rect contentBounds) {
         _contentBounds = contentBounds;
         _sidewaysOffset = 0;
     }
-    if (!_cursorName) {
-        rememberCursor(); // of a table that was never reloaded
-    }
     keepCursorInWindow();
 }
 
-std::size_t TerminalTable::shownRows() const {
-    return _filter.empty() ? totalRows() : _matches.size();
-}
-
-std::size_t TerminalTable::rowAt(std::size_t shown) const {
-    return _filter.empty() ? shown : _matches[shown];
-}
-
-std::optional<std::size_t> TerminalTable::cursorRow() const {
-    if (_cursor >= shownRows()) {
-        return std::nullopt;
-    }
-    return rowAt(_cursor);
-}
-
 void TerminalTable::moveCursor(std::ptrdiff_t rows) {
-    const auto target = static_cast<std::ptrdiff_t>(_cursor) + rows;
+    const auto target = static_cast<std::ptrdiff_t>(pane().cursor()) + rows;
     moveCursorTo(static_cast<std::size_t>(std::max<std::ptrdiff_t>(target, 0)));
 }
 
 void TerminalTable::moveCursorTo(std::size_t shown) {
-    const std::size_t count = shownRows();
-    _cursor = count == 0 ? 0 : std::min(shown, count - 1);
+    pane().moveCursorTo(shown);
     _sidewaysOffset = 0;
-    rememberCursor();
     keepCursorInWindow();
     _needsDisplay();
 }
@@ -100,7 +70,7 @@ void TerminalTable::scroll(std::ptrdiff_t rows) {
     const auto last = static_cast<std::ptrdiff_t>(lastFirstShown());
     const auto target = static_cast<std::ptrdiff_t>(_firstShown) + rows;
     _firstShown = static_cast<std::size_t>(std::clamp<std::ptrdiff_t>(target, 0, last));
-    moveCursorTo(std::clamp(_cursor, _firstShown, _firstShown + _windowRows - 1));
+    moveCursorTo(std::clamp(pane().cursor(), _firstShown, _firstShown + _windowRows - 1));
 }
 
 std::ptrdiff_t TerminalTable::page() const {
@@ -108,15 +78,12 @@ std::ptrdiff_t TerminalTable::page() const {
 }
 
 void TerminalTable::setFilter(std::string text) {
-    _filter = std::move(text);
-    filterRows();
-    findCursor();
-    keepCursorInWindow();
-    _needsDisplay();
+    pane().setFilter(std::move(text));
+    reloadData();
 }
 
 bool TerminalTable::scrollSideways(int columns) {
-    const auto row = cursorRow();
+    const auto row = pane().cursorRow();
     if (!row) {
         return false;
     }
@@ -132,63 +99,23 @@ bool TerminalTable::scrollSideways(int columns) {
     if (_sidewaysOffset == current) {
         return false;
     }
+    _scrolledName = cursorName();
     _needsDisplay();
     return true;
 }
 
-void TerminalTable::filterRows() {
-    _matches.clear();
-    if (_filter.empty()) {
-        return;
-    }
-    for (std::size_t row = 0; row < totalRows(); ++row) {
-        if (passes(_source.textOfRow(row), _filter)) {
-            _matches.push_back(row);
-        }
-    }
-}
-
-/// Where there is no row for now, the last one's name is kept: it may come back.
-void TerminalTable::rememberCursor() {
-    if (const auto row = cursorRow()) {
-        _cursorName = _source.textOfRow(*row).name;
-    }
-}
-
-/// Mostly the row is where it was. Otherwise the nearest one of that name is taken, and where
-/// there is none any more, the cursor stays at its place.
-void TerminalTable::findCursor() {
-    const std::size_t count = shownRows();
-    const auto isIt = [this, count](std::size_t shown) {
-        return shown < count && _source.textOfRow(rowAt(shown)).name == _cursorName;
-    };
-    const std::size_t reach = _cursorName ? std::max(count, _cursor + 1) : 0;
-    for (std::size_t distance = 0; distance < reach; ++distance) {
-        if (isIt(_cursor + distance)) {
-            _cursor += distance;
-            return;
-        }
-        if (distance <= _cursor && isIt(_cursor - distance)) {
-            _cursor -= distance;
-            return;
-        }
-    }
-    _cursor = count == 0 ? 0 : std::min(_cursor, count - 1);
-    _sidewaysOffset = 0;
-    rememberCursor();
-}
-
 std::size_t TerminalTable::lastFirstShown() const {
-    const std::size_t count = shownRows();
+    const std::size_t count = pane().shownRows();
     return count > _windowRows ? count - _windowRows : 0;
 }
 
 void TerminalTable::keepCursorInWindow() {
     _firstShown = std::min(_firstShown, lastFirstShown());
-    if (_cursor < _firstShown) {
-        _firstShown = _cursor;
-    } else if (_cursor >= _firstShown + _windowRows) {
-        _firstShown = _cursor - _windowRows + 1;
+    const std::size_t cursor = pane().cursor();
+    if (cursor < _firstShown) {
+        _firstShown = cursor;
+    } else if (cursor >= _firstShown + _windowRows) {
+        _firstShown = cursor - _windowRows + 1;
     }
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "app/pane/PaneModel.h"
 #include "platform/ui/TableView.h"
 
 #include <cstddef>
@@ -7,14 +8,11 @@
 #include <optional>
 #include <string>
 #include <string_view>
-#include <vector>
 
 namespace pallax::terminal {
 
-/// A table of which a terminal shows a window of rows, with a cursor on one of them. The cursor
-/// keeps to its row, by name, when the rows change.
-///
-/// Row numbers are the source's, but for `shown…`: those count the rows that pass the filter.
+/// A table of which a terminal shows a window of rows. Its source owns a pane, which knows the
+/// rows, the filter and the cursor; the window follows the cursor.
 class TerminalTable final : public ui::TableView {
 public:
     /// Called when something must be drawn anew.
@@ -32,29 +30,22 @@ public:
     /// The room that there is now, in rows; and what a cell has, in points.
     void setViewport(std::size_t rows, ui::Rect contentBounds);
 
-    std::size_t totalRows() const { return _source.numberOfRows(); }
-    std::size_t shownRows() const;
+    /// The source's pane.
+    PaneModel& pane() const;
     /// The first shown row in the window.
     std::size_t firstShown() const { return _firstShown; }
-    /// The row behind a shown one; `shown` is below shownRows().
-    std::size_t rowAt(std::size_t shown) const;
-    /// The shown row on which the cursor stands; below shownRows() unless there are none.
-    std::size_t cursor() const { return _cursor; }
-    std::optional<std::size_t> cursorRow() const;
 
-    /// Moves by so many rows, stopping at the ends.
+    /// Moves the cursor by so many rows, stopping at the ends.
     void moveCursor(std::ptrdiff_t rows);
     void moveCursorTo(std::size_t shown);
     /// Moves the window by so many rows, stopping at the ends; the cursor stays inside it.
     void scroll(std::ptrdiff_t rows);
     /// A window's height, less one row.
     std::ptrdiff_t page() const;
-    void moveToEnd() { moveCursorTo(shownRows()); }
+    void moveToEnd() { moveCursorTo(pane().shownRows()); }
 
-    /// Rows whose name or value holds this text stay, whatever the case of ASCII letters; the
-    /// empty text lets all stay.
+    /// The pane's filter; the window follows the cursor.
     void setFilter(std::string text);
-    const std::string& filter() const { return _filter; }
 
     /// How far the cursor's row is scrolled sideways, in columns.
     int sidewaysOffset() const { return _sidewaysOffset; }
@@ -64,9 +55,7 @@ public:
     ui::TableSource& source() { return _source; }
 
 private:
-    void filterRows();
-    void rememberCursor();
-    void findCursor();
+    std::optional<std::string> cursorName() const;
     /// The last row at which a window can begin without room below its rows.
     std::size_t lastFirstShown() const;
     void keepCursorInWindow();
@@ -76,17 +65,11 @@ private:
     NeedsDisplay _needsDisplay;
     std::size_t _windowRows = 1;
     std::size_t _firstShown = 0;
-    std::size_t _cursor = 0;
-    std::optional<std::string> _cursorName; // of the row under the cursor, or the last one there
-    std::string _filter;
-    std::vector<std::size_t> _matches; // the rows that pass, while there is a filter
     int _sidewaysOffset = 0;
+    std::optional<std::string> _scrolledName; ///< of the row that is scrolled sideways
 };
 
 /// Every table of this front end's screens was made by its toolkit.
 TerminalTable& terminalTable(ui::TableView& table);
-
-/// Where `wanted` first stands in `text`, whatever the case of ASCII letters.
-std::size_t findIgnoringCase(std::string_view text, std::string_view wanted);
 
 } // namespace pallax::terminal

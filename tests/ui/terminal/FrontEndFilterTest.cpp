@@ -16,9 +16,9 @@ protected:
 
 TEST_F(FrontEndFilterTest, RowsGoAndComeWithEveryCharacter) {
     stage.type("/");
-    EXPECT_EQ(stage.table().shownRows(), 6U);
+    EXPECT_EQ(stage.pane().shownRows(), 6U);
     stage.type("-9");
-    EXPECT_EQ(stage.table().shownRows(), 3U); // by value
+    EXPECT_EQ(stage.pane().shownRows(), 3U); // by value
     stage.type("5");
     EXPECT_EQ(stage.screen(), R"(
  … › Serving Cell Measurements   1 of 6
@@ -35,13 +35,13 @@ TEST_F(FrontEndFilterTest, RowsGoAndComeWithEveryCharacter) {
  / -95                 Esc clear filter
 )");
     stage.press(Key::Backspace);
-    EXPECT_EQ(stage.table().shownRows(), 3U);
+    EXPECT_EQ(stage.pane().shownRows(), 3U);
 }
 
 TEST_F(FrontEndFilterTest, TheCaseOfLettersDoesNotMatter) {
     stage.type("/VeRsIoN");
     EXPECT_EQ(stage.cursorName(), "Version");
-    EXPECT_EQ(stage.table().shownRows(), 1U);
+    EXPECT_EQ(stage.pane().shownRows(), 1U);
 }
 
 TEST_F(FrontEndFilterTest, ARowWithoutAMatchIsNotShown) {
@@ -58,7 +58,7 @@ TEST_F(FrontEndFilterTest, ARowWithoutAMatchIsNotShown) {
 TEST_F(FrontEndFilterTest, EscClearsTheFilter) {
     stage.type("/rsrp");
     stage.press(Key::Escape);
-    EXPECT_EQ(stage.table().filter(), "");
+    EXPECT_EQ(stage.pane().filter(), "");
     EXPECT_EQ(stage.depth(), 2U);
     EXPECT_EQ(stage.line(11), " Updated 2023-11-14 at 22:13:20  ? help");
     EXPECT_EQ(draw().cursor(), std::nullopt);
@@ -67,11 +67,11 @@ TEST_F(FrontEndFilterTest, EscClearsTheFilter) {
 TEST_F(FrontEndFilterTest, EnterKeepsTheFilterAndEscClearsItLaterBeforeItGoesBack) {
     stage.type("/rsrp");
     stage.press(Key::Enter);
-    EXPECT_EQ(stage.table().filter(), "rsrp");
+    EXPECT_EQ(stage.pane().filter(), "rsrp");
     stage.type("j"); // a key of the pane again
     EXPECT_EQ(stage.cursorName(), "Average RSRP");
     stage.press(Key::Escape);
-    EXPECT_EQ(stage.table().filter(), "");
+    EXPECT_EQ(stage.pane().filter(), "");
     EXPECT_EQ(stage.cursorName(), "Average RSRP");
     EXPECT_EQ(stage.depth(), 2U);
     stage.press(Key::Escape);
@@ -91,37 +91,37 @@ TEST_F(FrontEndFilterTest, SlashGoesOnWithTheFilterThatThereIs) {
     stage.type("/rs");
     stage.press(Key::Enter);
     stage.type("/rq");
-    EXPECT_EQ(stage.table().filter(), "rsrq");
+    EXPECT_EQ(stage.pane().filter(), "rsrq");
     EXPECT_EQ(stage.cursorName(), "Measured RSRQ");
 }
 
 TEST_F(FrontEndFilterTest, ArrowsAndPagesMoveAmongTheRowsWhileItIsTyped) {
     stage.type("/r");
-    ASSERT_EQ(stage.table().shownRows(), 5U);
+    ASSERT_EQ(stage.pane().shownRows(), 5U);
     (void)stage.frontEnd.draw();
     stage.press(Key::Down);
-    EXPECT_EQ(stage.table().cursor(), 1U);
+    EXPECT_EQ(stage.pane().cursor(), 1U);
     stage.press(Key::PageDown);
-    EXPECT_EQ(stage.table().cursor(), 4U);
+    EXPECT_EQ(stage.pane().cursor(), 4U);
     stage.press(Key::Up);
-    EXPECT_EQ(stage.table().cursor(), 3U);
+    EXPECT_EQ(stage.pane().cursor(), 3U);
     stage.press(Key::PageUp);
-    EXPECT_EQ(stage.table().cursor(), 0U);
-    EXPECT_EQ(stage.table().filter(), "r");
+    EXPECT_EQ(stage.pane().cursor(), 0U);
+    EXPECT_EQ(stage.pane().filter(), "r");
 }
 
 TEST_F(FrontEndFilterTest, OtherKeysEditItsText) {
     stage.type("/srp");
     stage.press(Key::Home);
     stage.type("R");
-    EXPECT_EQ(stage.table().filter(), "Rsrp");
+    EXPECT_EQ(stage.pane().filter(), "Rsrp");
     stage.press(Key::End);
     stage.pressControl('u');
-    EXPECT_EQ(stage.table().filter(), "");
+    EXPECT_EQ(stage.pane().filter(), "");
     stage.type("jkhlgGqs?/y漢");
-    EXPECT_EQ(stage.table().filter(), "jkhlgGqs?/y漢");
+    EXPECT_EQ(stage.pane().filter(), "jkhlgGqs?/y漢");
     stage.press(Key::Tab);
-    EXPECT_EQ(stage.table().filter(), "jkhlgGqs?/y漢");
+    EXPECT_EQ(stage.pane().filter(), "jkhlgGqs?/y漢");
     EXPECT_EQ(stage.quits, 0);
     EXPECT_EQ(stage.saveScreen(), nullptr);
 }
@@ -164,7 +164,7 @@ TEST_F(FrontEndFilterTest, TypingEndsWhenAClickOpensAnotherPane) {
     EXPECT_EQ(draw().cursor(), std::nullopt);
     stage.type("q");
     EXPECT_EQ(stage.depth(), 1U);
-    EXPECT_EQ(stage.table().filter(), "info"); // kept, but not typed any more
+    EXPECT_EQ(stage.pane().filter(), "info"); // kept, but not typed any more
     EXPECT_EQ(stage.line(4), " …11-14 at 22:13:20");
 }
 
@@ -173,7 +173,7 @@ TEST_F(FrontEndFilterTest, TypingEndsWhenItsPaneIsGone) {
     stage.tick(Dictionary{{"A", "1"}, {"B", "2"}});
     ASSERT_EQ(stage.depth(), 1U);
     stage.type("j");
-    EXPECT_EQ(stage.table().filter(), "");
+    EXPECT_EQ(stage.pane().filter(), "");
     EXPECT_EQ(stage.cursorName(), "B");
     EXPECT_EQ(draw().cursor(), std::nullopt);
 }
@@ -182,12 +182,12 @@ TEST_F(FrontEndFilterTest, EveryPaneHasItsOwnFilter) {
     stage.press(Key::Left);
     stage.type("/cell");
     stage.press(Key::Enter);
-    EXPECT_EQ(stage.table().shownRows(), 2U);
+    EXPECT_EQ(stage.pane().shownRows(), 2U);
     stage.press(Key::Enter);
-    EXPECT_EQ(stage.table().shownRows(), 6U);
-    EXPECT_EQ(stage.table().filter(), "");
+    EXPECT_EQ(stage.pane().shownRows(), 6U);
+    EXPECT_EQ(stage.pane().filter(), "");
     stage.press(Key::Left);
-    EXPECT_EQ(stage.table().filter(), "cell");
+    EXPECT_EQ(stage.pane().filter(), "cell");
 }
 
 } // namespace

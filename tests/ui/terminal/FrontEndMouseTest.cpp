@@ -78,11 +78,11 @@ TEST_F(FrontEndMouseTest, AClickOnAHintDoesWhatItsKeyDoes) {
     stage.type("info");
     clickOn("Esc clear filter"); // beside the prompt
     EXPECT_FALSE(isEditing());
-    EXPECT_EQ(stage.table().filter(), "");
+    EXPECT_EQ(stage.pane().filter(), "");
     stage.type("/info");
     stage.press(Key::Enter);
     clickOn("Esc clear filter"); // in the toolbar
-    EXPECT_EQ(stage.table().filter(), "");
+    EXPECT_EQ(stage.pane().filter(), "");
     clickOn("? help");
     EXPECT_NE(stage.screen().find("┌ Keys"), std::string::npos);
     stage.press(Key::Escape);
@@ -146,8 +146,8 @@ TEST_F(FrontEndMouseTest, TheWheelMovesTheCursorByThreeRows) {
 TEST_F(FrontEndMouseTest, TheWheelWorksWhileAFilterIsTyped) {
     stage.type("/e");
     stage.mouse(Key::WheelDown, 5, 5);
-    EXPECT_EQ(stage.table().cursor(), 3U);
-    EXPECT_EQ(stage.table().filter(), "e");
+    EXPECT_EQ(stage.pane().cursor(), 3U);
+    EXPECT_EQ(stage.pane().filter(), "e");
 }
 
 TEST_F(FrontEndMouseTest, AClickOnSaveSaves) {

@@ -145,11 +145,11 @@ private:
                 return "a cursor outside the screen";
             }
         }
-        const TerminalTable& table = _stage.table();
-        if (table.cursor() >= table.shownRows() && table.shownRows() > 0) {
+        const PaneModel& pane = _stage.pane();
+        if (pane.cursor() >= pane.shownRows() && pane.shownRows() > 0) {
             return "a cursor on no row";
         }
-        if (table.firstShown() > table.cursor()) {
+        if (_stage.table().firstShown() > pane.cursor()) {
             return "a cursor above the window";
         }
         return faultOf(grid);

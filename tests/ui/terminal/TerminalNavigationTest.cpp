@@ -23,7 +23,6 @@ public:
     void viewWillDisappear(bool animated) override { note("disappears", animated); }
     std::size_t numberOfRows() const override { return 0; }
     std::shared_ptr<ui::TableCell> cellForRow(std::size_t /*row*/) override { return nullptr; }
-    ui::RowText textOfRow(std::size_t /*row*/) const override { return {}; }
     void didSelectRow(std::optional<std::size_t> /*row*/) override {}
     const std::string& name() const { return _name; }
 
@@ -49,7 +48,6 @@ public:
     bool textFieldShouldReturn(ui::TextField& /*field*/) override { return true; }
     std::size_t numberOfRows() const override { return 0; }
     std::shared_ptr<ui::TableCell> cellForRow(std::size_t /*row*/) override { return nullptr; }
-    ui::RowText textOfRow(std::size_t /*row*/) const override { return {}; }
     void didSelectRow(std::optional<std::size_t> /*row*/) override {}
 
 private:

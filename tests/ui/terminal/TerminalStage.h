@@ -104,10 +104,11 @@ public:
     std::string line(int y) { return frontEnd.draw().lines().at(static_cast<std::size_t>(y)); }
 
     TerminalTable& table() { return terminalTable(_stack->screens().back()->table()); }
+    PaneModel& pane() { return table().pane(); }
     /// The name of the row under the cursor.
     std::string cursorName() {
-        const auto row = table().cursorRow();
-        return row ? table().source().textOfRow(*row).name : "(none)";
+        const auto row = pane().cursorRow();
+        return row ? pane().row(*row).name : "(none)";
     }
     std::size_t depth() const { return _stack->screens().size(); }
     const std::shared_ptr<PallaxSaveViewController>& saveScreen() const { return _saveScreen; }

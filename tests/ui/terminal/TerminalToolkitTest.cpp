@@ -16,7 +16,6 @@ public:
     using TableScreen::TableScreen;
     std::size_t numberOfRows() const override { return 0; }
     std::shared_ptr<ui::TableCell> cellForRow(std::size_t /*row*/) override { return nullptr; }
-    ui::RowText textOfRow(std::size_t /*row*/) const override { return {}; }
     void didSelectRow(std::optional<std::size_t> /*row*/) override {}
 };
 

@@ -1,6 +1,8 @@
 #pragma once
 
 #include "app/PallaxCell.h"
+#include "app/pane/PaneModel.h"
+#include "tests/app/pane/PaneNodes.h"
 #include "ui/terminal/TerminalMetrics.h"
 #include "ui/terminal/TerminalTable.h"
 
@@ -13,42 +15,20 @@
 
 namespace pallax::terminal {
 
-inline ui::RowText leafRow(std::string name, std::string value) {
-    ui::RowText row;
-    row.name = std::move(name);
-    row.value = std::move(value);
-    return row;
-}
-
-inline ui::RowText branchRow(std::string name, std::optional<std::size_t> elements = {}) {
-    ui::RowText row;
-    row.name = std::move(name);
-    row.elements = elements;
-    row.isBranch = true;
-    return row;
-}
-
 /// Rows of text as a table's source, laid out as the application lays out its own.
-class TextRows final : public ui::TableSource {
+class TextRows final : public ui::TableSource, public PaneOwner {
 public:
-    TextRows() = default;
     /// Leaves of these names, each with the value "-".
-    TextRows(std::initializer_list<const char*> names) { set(names); }
+    TextRows(std::initializer_list<const char*> names) : _pane(doubles::sectionOf(names), "/") {}
 
-    void set(std::initializer_list<const char*> names) {
-        rows.clear();
-        for (const char* name : names) {
-            rows.push_back(leafRow(name, "-"));
-        }
-    }
+    void show(std::vector<NodeRef> rows) { _pane.show(doubles::treeNode("Rows", std::move(rows))); }
 
-    std::vector<ui::RowText> rows;
     ui::Rect bounds; ///< that a cell gets
-    std::vector<std::optional<std::size_t>> selected;
 
-    std::size_t numberOfRows() const override { return rows.size(); }
+    PaneModel& pane() override { return _pane; }
+    std::size_t numberOfRows() const override { return _pane.totalRows(); }
     std::shared_ptr<ui::TableCell> cellForRow(std::size_t row) override {
-        const ui::RowText& text = rows.at(row);
+        const PaneRow text = _pane.row(row);
         auto cell = std::make_shared<PallaxCell>(
             text.isBranch ? PallaxCell::Kind::Branch : PallaxCell::Kind::Leaf, "Row", _metrics);
         cell->setContentBounds(bounds);
@@ -57,15 +37,15 @@ public:
             cell->setAccessory(ui::CellAccessory::DisclosureIndicator);
             cell->setLayoutKey();
         } else {
-            cell->value()->text = text.value.value_or("");
+            cell->value()->text = text.text.value_or("");
             cell->setLayout();
         }
         return cell;
     }
-    ui::RowText textOfRow(std::size_t row) const override { return rows.at(row); }
-    void didSelectRow(std::optional<std::size_t> row) override { selected.push_back(row); }
+    void didSelectRow(std::optional<std::size_t> /*row*/) override {}
 
 private:
+    PaneModel _pane;
     TerminalMetrics _metrics;
 };
 
