@@ -9,7 +9,8 @@
 namespace pallax::ui {
 
 /// The front end's side of a screen: what the toolkit does by itself when the screen passes one
-/// of its moments on, and what it redraws.
+/// of its moments on, and what it redraws. It is made before its screen and never told which one
+/// that is: a front end that has to know looks for the screen whose `view()` it is.
 class ScreenView {
 public:
     virtual ~ScreenView() = default;
@@ -26,6 +27,9 @@ public:
 
 /// One screen: a title, a toolbar, and the moments of its life, which the toolkit calls. A class
 /// that overrides a moment decides whether the toolkit's own handling runs.
+///
+/// NavigationStack says when a screen appears and disappears. It calls viewDidLoad and
+/// viewDidUnload of a modal screen; for the screens that lie on it, it need not call either.
 class Screen {
 public:
     explicit Screen(std::unique_ptr<ScreenView> view) : _view(std::move(view)) {}

@@ -24,6 +24,10 @@ struct ModalOutlets {
 };
 
 /// A front end, as the controllers see it. It outlives all that it makes.
+///
+/// The roles that a screen gives back (`view()`, `table()`, `list()`, `field()`) are the objects
+/// that its toolkit made, so the front end may cast them to its own classes. A table knows its
+/// source from the start.
 class Toolkit {
 public:
     virtual ~Toolkit() = default;

@@ -241,6 +241,22 @@ TEST_F(PallaxPaneControllerTest, AReusedCellOfTheSameKindShowsTheOtherNode) {
     EXPECT_EQ(second->value()->text, "2");
 }
 
+TEST_F(PallaxPaneControllerTest, ANewCellGetsTheTablesContentAreaWhateverItsAccessory) {
+    const PaneRef pane = shownPane();
+    tableOf(*pane).bounds = {{0, 0}, {500, 44}};
+    for (const std::size_t row : {0U, 1U}) {
+        EXPECT_EQ(cellOf(*pane, row)->contentBounds(), (Rect{{0, 0}, {500, 44}}));
+    }
+}
+
+TEST_F(PallaxPaneControllerTest, ACellAskedForAgainIsLaidOutForTheWidthThatThereIsNow) {
+    const PaneRef pane = shownPane();
+    const auto cell = cellOf(*pane, 0);
+    tableOf(*pane).bounds = {{0, 0}, {500, 44}};
+    EXPECT_EQ(cell->view()->frame, (Rect{{0, 0}, {320, 50}}));
+    EXPECT_EQ(cellOf(*pane, 0)->view()->frame, (Rect{{0, 0}, {500, 50}}));
+}
+
 TEST_F(PallaxPaneControllerTest, AReusedCellKeepsTheContentAreaThatTheTableGaveIt) {
     const PaneRef pane = shownPane();
     const auto cell = cellOf(*pane, 0);

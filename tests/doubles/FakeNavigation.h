@@ -37,6 +37,9 @@ public:
     }
     void popTo(std::size_t index, bool animated) override {
         _diary.push_back("stack popTo " + std::to_string(index) + " animated=" + truth(animated));
+        if (index + 1 >= _screens.size()) {
+            return;
+        }
         top().viewWillDisappear(animated);
         _screens.resize(index + 1);
         show(animated);

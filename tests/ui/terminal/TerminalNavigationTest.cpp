@@ -19,8 +19,10 @@ class DiaryPane final : public ui::TableScreen {
 public:
     DiaryPane(ui::Toolkit& toolkit, Diary& diary, std::string name)
         : TableScreen(toolkit), _diary(diary), _name(std::move(name)) {}
+    void viewDidLoad() override { note("loaded", false); }
     void viewWillAppear(bool animated) override { note("appears", animated); }
     void viewWillDisappear(bool animated) override { note("disappears", animated); }
+    void viewDidUnload() override { note("unloaded", false); }
     std::size_t numberOfRows() const override { return 0; }
     std::shared_ptr<ui::TableCell> cellForRow(std::size_t /*row*/) override { return nullptr; }
     void didSelectRow(std::optional<std::size_t> /*row*/) override {}
@@ -92,11 +94,12 @@ TEST_F(TerminalNavigationTest, APushedPaneAppearsAfterTheDelegateIsTold) {
     EXPECT_EQ(stack.screens().size(), 2U);
 }
 
-TEST_F(TerminalNavigationTest, PoppingTakesOffEveryPaneAbove) {
+TEST_F(TerminalNavigationTest, PoppingTakesOffEveryPaneAboveAtOnce) {
     stack.push(pane("second"), false);
     stack.push(pane("third"), false);
     take();
     stack.popTo(0, true);
+    EXPECT_EQ(stack.screens().size(), 1U);
     EXPECT_EQ(take(), (Diary{"third disappears animated", "will show root animated",
                              "root appears animated"}));
     EXPECT_TRUE(stack.isAtRoot());
@@ -140,6 +143,15 @@ TEST_F(TerminalNavigationTest, AModalScreenIsLoadedAppearsAndIsEditedAtOnce) {
     EXPECT_EQ(take(), (Diary{"modal loaded", "modal appears"}));
     EXPECT_EQ(stack.modal(), modal);
     EXPECT_TRUE(terminalTextField(modal->field()).isEditing());
+}
+
+TEST_F(TerminalNavigationTest, ThePaneBelowAModalScreenIsToldNothing) {
+    stack.push(pane("second"), false);
+    take();
+    stack.presentModal(std::make_shared<DiaryModal>(toolkit, diary), true);
+    stack.dismissModal(true);
+    EXPECT_EQ(take(),
+              (Diary{"modal loaded", "modal appears", "modal disappears", "modal unloaded"}));
 }
 
 TEST_F(TerminalNavigationTest, ADismissedModalScreenDisappearsAndIsGone) {
