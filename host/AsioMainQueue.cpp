@@ -118,9 +118,11 @@ void AsioMainQueue::run() {
     _impl->context.restart();
 }
 
-void AsioMainQueue::runReady() {
+bool AsioMainQueue::runReady() {
     _impl->context.poll();
+    const bool isStopped = _impl->context.stopped();
     _impl->context.restart();
+    return !isStopped;
 }
 
 void AsioMainQueue::stop() {

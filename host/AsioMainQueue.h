@@ -2,6 +2,7 @@
 
 #include "platform/MainQueue.h"
 #include "platform/RepeatingTimer.h"
+#include "platform/RunLoop.h"
 
 #include <chrono>
 #include <functional>
@@ -10,9 +11,9 @@
 
 namespace pallax {
 
-/// The main queue and its timers, on Asio. Blocks, timers, signals and descriptor watches all run
-/// inside `run`, on the thread that calls it; only `async` may be called from another thread.
-class AsioMainQueue final : public MainQueue, public TimerScheduler {
+/// The main queue, its timers and its loop, on Asio. Blocks, timers, signals and descriptor watches
+/// all run inside `run` or `runReady`; only `async` may be called from another thread.
+class AsioMainQueue final : public MainQueue, public TimerScheduler, public RunLoop {
 public:
     AsioMainQueue();
     ~AsioMainQueue() override;
@@ -25,14 +26,9 @@ public:
     std::unique_ptr<RepeatingTimer> scheduleRepeating(std::chrono::nanoseconds interval,
                                                       std::function<void()> action) override;
 
-    /// Runs blocks, waiting for them, until `stop`. An exception of a block leaves through here;
-    /// run may then be called again and goes on with the next block.
-    void run();
-    /// Runs what is ready now, without waiting; what those blocks post included. For tests and fuzz
-    /// targets, which step the queue; the programs run it.
-    void runReady();
-    /// Makes `run` return after the present block, or the next `run` return at once.
-    void stop();
+    void run() override;
+    bool runReady() override;
+    void stop() override;
 
     /// Calls `action` as a block for each of these signals, instead of what they do by default.
     /// A later call replaces an earlier one.

@@ -50,6 +50,39 @@ TEST(AsioMainQueue, AStopBeforeRunMakesItReturnAtOnceAndOnlyOnce) {
     EXPECT_EQ(blocks, 1);
 }
 
+TEST(AsioMainQueue, ALoopThatIsNotItsOwnRunsWhatIsReadyUntilItIsStopped) {
+    AsioMainQueue queue;
+    RunLoop& loop = queue;
+    EXPECT_TRUE(loop.runReady()) << "nothing is ready, which is no end";
+    int blocks = 0;
+    queue.async([&] {
+        ++blocks;
+        loop.stop();
+        queue.async([&] { ++blocks; });
+    });
+    EXPECT_FALSE(loop.runReady());
+    EXPECT_EQ(blocks, 1);
+    EXPECT_TRUE(loop.runReady()) << "a stop holds once";
+    EXPECT_EQ(blocks, 2);
+    loop.stop();
+    EXPECT_FALSE(loop.runReady());
+}
+
+TEST(AsioMainQueue, TimersRunUnderALoopThatIsNotItsOwn) {
+    AsioMainQueue queue;
+    RunLoop& loop = queue;
+    int firings = 0;
+    const auto timer = queue.scheduleRepeating(1ms, [&] {
+        if (++firings == 3) {
+            loop.stop();
+        }
+    });
+    while (loop.runReady()) {
+        std::this_thread::yield();
+    }
+    EXPECT_EQ(firings, 3);
+}
+
 TEST(AsioMainQueue, AnExceptionLeavesThroughRunWhichThenGoesOn) {
     AsioMainQueue queue;
     std::vector<int> order;
