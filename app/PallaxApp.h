@@ -87,6 +87,8 @@ public:
     void navigationControllerWillShow(ui::NavigationStack& stack, ui::TableScreen& screen,
                                       bool animated) override;
 
+    bool isConnected() const { return _model && _model->isConnected(); }
+
     /// Null before the launch and after termination.
     ui::Window* window() const { return _window.get(); }
     void setWindow(std::unique_ptr<ui::Window> window) { _window = std::move(window); }
@@ -107,7 +109,6 @@ public:
     ui::NavigationStack* navigationController() override { return _navController.get(); }
 
 private:
-    bool isConnected() const { return _model && _model->isConnected(); }
     NodeRef nodeOf(const PallaxPaneController& pane, std::size_t index);
     void reloadPanes();
     void updateTopStatus();

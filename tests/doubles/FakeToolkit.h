@@ -19,6 +19,7 @@ public:
     FakeTextMetrics metrics;
     ScreenDiary diary;
     std::vector<ui::Alert> alerts;
+    FakeNavigationStack* stack = nullptr; ///< the latest that was made
     ui::Rect bounds{{0, 0}, {320, 480}};
     ui::Rect applicationArea{{0, 20}, {320, 460}};
 
@@ -33,7 +34,9 @@ public:
     std::unique_ptr<ui::NavigationStack>
     makeNavigationStack(std::shared_ptr<ui::TableScreen> root) override {
         diary.emplace_back("make stack");
-        return std::make_unique<FakeNavigationStack>(diary, std::move(root));
+        auto madeStack = std::make_unique<FakeNavigationStack>(diary, std::move(root));
+        stack = madeStack.get();
+        return madeStack;
     }
     std::unique_ptr<ui::ScreenView> makeScreenView() override {
         return std::make_unique<FakeScreenView>(diary, made("screen", ++_screens));
