@@ -13,6 +13,7 @@ class Bundle;
 class Clock;
 class LogGenerator;
 class Resources;
+class SampleSink;
 class StandardOutput;
 
 /// What a generator needs of its surroundings. All of it outlives the generator.
@@ -55,6 +56,9 @@ public:
     /// The live display, with every packet that has arrived, or null when there is none yet. Its
     /// sections are those of the history's entries, which are up to date afterwards too.
     PropertyList display(const Dictionary& state);
+    /// Gives the samples of later packets to `sink`, too, until it is null. The caller begins and
+    /// ends the packets. The sink outlives the generator, or is taken away.
+    virtual void setSampleSink(SampleSink* /*sink*/) {}
     /// Brings the live display up to the latest packet, for whoever looks at it, or at the history,
     /// without generating it: a generator may read a packet as late as that.
     virtual void catchUp() {}

@@ -177,6 +177,12 @@ void ZORLogGenerator2::catchUp() {
     }
 }
 
+void ZORLogGenerator2::setSampleSink(SampleSink* sink) {
+    if (cIndex != nullptr) {
+        cIndex->setSink(sink);
+    }
+}
+
 PropertyList ZORLogGenerator2::getStartCommand() const {
     if (cIndex == nullptr) {
         return {};

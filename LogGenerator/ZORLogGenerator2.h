@@ -24,6 +24,7 @@ public:
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
     void catchUp() override;
+    void setSampleSink(SampleSink* sink) override;
     PropertyList getStartCommand() const override;
 
     /// Framing and dispatch of one packet.

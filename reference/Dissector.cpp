@@ -1,6 +1,7 @@
 #include "reference/Dissector.h"
 
 #include "LogGenerator/Records/Base.h"
+#include "fields/FieldRegistry.h"
 #include "host/Recording.h"
 #include "reference/DissectorFields.h"
 #include "reference/LuaText.h"
@@ -22,23 +23,6 @@ constexpr std::string_view kHead =
 -- or put it among the analyser's personal plugins.
 
 )";
-
-/// "Serving Cell Info" as "serving_cell_info".
-std::string filterWord(std::string_view text) {
-    std::string word;
-    for (const char character : text) {
-        const bool letter = (character >= 'a' && character <= 'z') ||
-                            (character >= 'A' && character <= 'Z') ||
-                            (character >= '0' && character <= '9');
-        if (letter) {
-            const bool capital = character >= 'A' && character <= 'Z';
-            word.push_back(capital ? static_cast<char>(character - 'A' + 'a') : character);
-        } else if (!word.empty() && word.back() != '_') {
-            word.push_back('_');
-        }
-    }
-    return !word.empty() && word.back() == '_' ? word.substr(0, word.size() - 1) : word;
-}
 
 /// Writes one technology, indented, so that a change of one field is a change of one line.
 class TechnologyWriter {
@@ -89,7 +73,7 @@ private:
     }
 
     void writeSection(const SectionReference& section, const CodeDescription& code) {
-        _filter = filterWord(section.name);
+        _filter = fieldWord(section.name);
         LuaTable head;
         head.text("section", section.name);
         head.integer("least", static_cast<std::int64_t>(code.minimumLength));
@@ -122,7 +106,7 @@ private:
     void writeObjectKeys() {
         line(2, "objects = {");
         for (const SectionReference& section : _technology.sections) {
-            _filter = filterWord(section.name);
+            _filter = fieldWord(section.name);
             LuaTable keys;
             for (const std::string& key : section.objectKeys) {
                 keys.raw("[" + luaText(key) + "]", luaText(filterOf(key)));
@@ -159,7 +143,7 @@ private:
     }
 
     std::string filterOf(std::string_view key) const {
-        return key.empty() ? _filter : _filter + "." + filterWord(key);
+        return key.empty() ? _filter : _filter + "." + fieldWord(key);
     }
 
     void line(std::size_t indent, std::string_view text) {

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "reference/Reference.h"
+#include "fields/Reference.h"
 
 #include <span>
 #include <string>

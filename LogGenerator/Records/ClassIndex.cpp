@@ -27,6 +27,19 @@ std::vector<std::string> ClassIndex::getAllLogCodes() const {
     return codes;
 }
 
+void ClassIndex::addRows(LayoutRecord& record) {
+    _records.push_back({&record, _nextRow});
+    for (const CodeLayout& code : record.layout().codes) {
+        _nextRow += static_cast<FieldId>(rowCount(code));
+    }
+}
+
+void ClassIndex::setSink(SampleSink* sink) {
+    for (const auto& [record, firstRow] : _records) {
+        record->setSink(sink, firstRow);
+    }
+}
+
 void ClassIndex::catchUp() const {
     for (const auto& [name, record] : classDict) {
         record->catchUp();

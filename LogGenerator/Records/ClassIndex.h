@@ -1,11 +1,13 @@
 #pragma once
 
 #include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 #include "platform/StandardOutput.h"
 
 #include <memory>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #include <vector>
 
 namespace pallax {
@@ -29,6 +31,15 @@ public:
     const std::vector<Base*>* getSubscribers(LogCode logCode) const;
     /// Every code that has a subscriber, as decimal text, ascending.
     std::vector<std::string> getAllLogCodes() const;
+    /// The records in the order of their creation, in which their rows of fields are numbered.
+    struct Numbered {
+        LayoutRecord* record;
+        FieldId firstRow;
+    };
+    const std::vector<Numbered>& records() const { return _records; }
+    /// Gives the samples of all records to `sink`, too, until it is null. The sink outlives the
+    /// index, or is taken away.
+    void setSink(SampleSink* sink);
     /// Brings every section up to the latest record.
     void catchUp() const;
     /// Logs what the section dictionary is.
@@ -40,6 +51,9 @@ protected:
     std::unique_ptr<Record> create() {
         auto record = std::make_unique<Record>();
         record->initWithDict(classDict, codeDictionary);
+        if constexpr (std::is_base_of_v<LayoutRecord, Record>) {
+            addRows(*record);
+        }
         return record;
     }
 
@@ -49,7 +63,11 @@ protected:
     CodeDict codeDictionary;
 
 private:
+    void addRows(LayoutRecord& record);
+
     StandardOutput& _output;
+    std::vector<Numbered> _records;
+    FieldId _nextRow = 0;
 };
 
 } // namespace pallax

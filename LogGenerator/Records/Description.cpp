@@ -72,6 +72,31 @@ RecordDescription describe(const RecordLayout& layout) {
     return description;
 }
 
+namespace {
+
+void numberRows(std::vector<FieldDescription>& fields, std::vector<ListDescription>& lists,
+                FieldId& next) {
+    for (FieldDescription& field : fields) {
+        field.row = next++;
+    }
+    for (ListDescription& list : lists) {
+        numberRows(list.fields, list.lists, next);
+    }
+}
+
+} // namespace
+
+FieldId numberRows(std::span<CodeDescription> codes, FieldId first) {
+    FieldId next = first;
+    for (CodeDescription& code : codes) {
+        numberRows(code.fields, code.lists, next);
+        for (SubpacketDescription& subpacket : code.subpackets) {
+            numberRows(subpacket.fields, subpacket.lists, next);
+        }
+    }
+    return next;
+}
+
 FieldDescription describeComputed(std::string_view key, const NumberFormat& format,
                                   std::string_view computation, std::string_view formula,
                                   std::vector<Extent> read) {
@@ -94,6 +119,8 @@ FieldDescription describeField(const Field& field) {
         description.counters.assign(computation->counters.begin(), computation->counters.end());
     }
     description.condition = copyOf(field.condition);
+    description.identifies = field.identifies;
+    description.isPersonal = field.isPersonal;
     return description;
 }
 

@@ -3,6 +3,7 @@
 #include "LogGenerator/Records/EntryList.h"
 #include "LogGenerator/Records/FieldGroup.h"
 #include "LogGenerator/Records/Layout.h"
+#include "LogGenerator/Records/Sample.h"
 #include "LogGenerator/Records/ShownAs.h"
 
 #include <cstddef>
@@ -36,6 +37,9 @@ struct FieldDescription {
     std::vector<Extent> read = {};      ///< what is computed of
     std::vector<Counter> counters = {}; ///< the counters among that, where there are some
     std::optional<Condition> condition = std::nullopt;
+    FieldId row = 0; ///< in the technology's numbering of its rows
+    bool identifies = false;
+    bool isPersonal = false;
 };
 
 /// Repeated entries.
@@ -112,6 +116,8 @@ using RecordDescription = std::vector<CodeDescription>;
 /// What the layout says, code by code.
 CodeDescription describe(const CodeLayout& layout);
 RecordDescription describe(const RecordLayout& layout);
+/// Numbers the rows of codes that follow one another from `first` on; returns the next number.
+FieldId numberRows(std::span<CodeDescription> codes, FieldId first);
 
 FieldDescription describeField(const Field& field);
 std::vector<FieldDescription> describeFields(std::span<const Field> fields);

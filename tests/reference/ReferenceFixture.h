@@ -1,8 +1,8 @@
 #pragma once
 
+#include "fields/Reference.h"
 #include "host/DirectoryResources.h"
 #include "host/Recording.h"
-#include "reference/Reference.h"
 
 #include <functional>
 #include <map>

@@ -1,11 +1,11 @@
-#include "reference/Reference.h"
+#include "fields/Reference.h"
 
 #include "LogGenerator/C2K/C2KLogGenerator.h"
 #include "LogGenerator/LTE/LTEClassIndex.h"
 #include "LogGenerator/UTRAN/UTRANClassIndex.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
+#include "fields/IfxSections.h"
 #include "host/Recording.h"
-#include "reference/IfxSections.h"
 
 #include <algorithm>
 #include <array>
@@ -33,15 +33,27 @@ DictionaryRef templateNamed(const Resources& resources, std::string_view name) {
     return entries;
 }
 
+std::vector<CodeDescription> describe(const Base& record, const ClassIndex& index) {
+    std::vector<CodeDescription> codes = record.describe();
+    for (const auto& [numbered, firstRow] : index.records()) {
+        if (numbered == &record) {
+            numberRows(codes, firstRow);
+        }
+    }
+    return codes;
+}
+
 /// The sections of the records, in the order of the template, whatever stands around them.
-void appendSections(const Dictionary& entries, const ClassIndex& index,
+void appendSections(const Dictionary& entries, const ClassIndex& index, const std::string& around,
                     std::vector<SectionReference>& sections) {
     for (const Dictionary::Entry& entry : entries) {
+        const std::string path = around + "/" + entry.key.string();
         if (const Base* record = index.getClass(entry.key.view())) {
-            sections.push_back({std::string(record->getSectionName()),
-                                record->sectionKind() == SectionKind::List, record->describe()});
+            sections.push_back({std::string(record->getSectionName()), path,
+                                record->sectionKind() == SectionKind::List,
+                                describe(*record, index)});
         } else if (const DictionaryRef inner = entry.value.dictionary()) {
-            appendSections(*inner, index, sections);
+            appendSections(*inner, index, path, sections);
         }
     }
 }
@@ -52,7 +64,7 @@ std::vector<SectionReference> recordSections(const Resources& resources,
     NoOutput output;
     const Index index(output);
     std::vector<SectionReference> sections;
-    appendSections(*templateNamed(resources, templateName), index, sections);
+    appendSections(*templateNamed(resources, templateName), index, "", sections);
     return sections;
 }
 
@@ -100,7 +112,7 @@ std::optional<CodeDescription> shownIn(const Places& places, const CodeDescripti
 }
 
 /// A section for each dictionary of the template that shows a lookup name.
-void appendPlaces(const Dictionary& entries, const std::string& path,
+void appendPlaces(const Dictionary& entries, const std::string& name, const std::string& path,
                   const std::vector<CodeDescription>& codes,
                   std::vector<SectionReference>& sections) {
     Places places;
@@ -110,7 +122,7 @@ void appendPlaces(const Dictionary& entries, const std::string& path,
         }
     }
     if (!places.empty()) {
-        SectionReference section{path};
+        SectionReference section{name, path};
         for (const CodeDescription& code : codes) {
             if (auto shown = shownIn(places, code)) {
                 section.codes.push_back(std::move(*shown));
@@ -120,17 +132,18 @@ void appendPlaces(const Dictionary& entries, const std::string& path,
     }
     for (const Dictionary::Entry& entry : entries) {
         if (const DictionaryRef inner = entry.value.dictionary()) {
-            std::string innerPath = path;
-            innerPath.append(path.empty() ? "" : " / ").append(entry.key.string());
-            appendPlaces(*inner, innerPath, codes, sections);
+            std::string innerName = name;
+            innerName.append(name.empty() ? "" : " / ").append(entry.key.string());
+            appendPlaces(*inner, innerName, path + "/" + entry.key.string(), codes, sections);
         }
     }
 }
 
 std::vector<SectionReference> cdmaSections(const Resources& resources) {
     std::vector<SectionReference> sections;
-    appendPlaces(*templateNamed(resources, "C2KTemplate"), "", C2KLogGenerator::describe(),
-                 sections);
+    std::vector<CodeDescription> codes = C2KLogGenerator::describe();
+    numberRows(codes, 0);
+    appendPlaces(*templateNamed(resources, "C2KTemplate"), "", "", codes, sections);
     return sections;
 }
 

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "LogGenerator/Records/Description.h"
+#include "fields/Meanings.h"
 #include "platform/Resources.h"
-#include "reference/Meanings.h"
 
 #include <string>
 #include <string_view>
@@ -15,6 +15,7 @@ struct RecordedTechnology;
 /// One section of a technology's display, and what fills it.
 struct SectionReference {
     std::string name; ///< of CDMA: the path in the template, "1x / Receiver 0"
+    std::string path; ///< of the section in the display: "/1x/Receiver 0"
     bool isList = false;
     /// Every log code that the section's record subscribes to, also one that shows nothing. The
     /// keys are display keys, of CDMA as well.

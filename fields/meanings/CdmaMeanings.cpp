@@ -1,4 +1,4 @@
-#include "reference/Meanings.h"
+#include "fields/Meanings.h"
 
 #include <array>
 

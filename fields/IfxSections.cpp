@@ -1,13 +1,15 @@
-#include "reference/IfxSections.h"
+#include "fields/IfxSections.h"
 
 namespace pallax {
 
 std::vector<SectionReference> ifxSections() {
     const auto keys = [](std::string name, std::vector<std::string> objectKeys) {
-        return SectionReference{std::move(name), false, {}, std::move(objectKeys)};
+        const std::string path = "/" + name;
+        return SectionReference{std::move(name), path, false, {}, std::move(objectKeys)};
     };
     const auto list = [](std::string name, std::vector<std::string> objectKeys) {
-        return SectionReference{std::move(name), true, {}, std::move(objectKeys)};
+        const std::string path = "/" + name;
+        return SectionReference{std::move(name), path, true, {}, std::move(objectKeys)};
     };
     return {
         keys("Network", {"Name", "MCC", "MNC"}),

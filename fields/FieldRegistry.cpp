@@ -1,0 +1,206 @@
+#include "fields/FieldRegistry.h"
+
+#include "host/Recording.h"
+
+#include <algorithm>
+#include <cmath>
+#include <tuple>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+/// The greatest and the least raw number that stand at a position.
+std::pair<double, double> rawRange(const Position& position) {
+    const unsigned magnitude = position.isSigned ? position.width - 1 : position.width;
+    const double beyond = std::ldexp(1.0, static_cast<int>(magnitude));
+    return {position.isSigned ? -beyond : 0.0, beyond - 1};
+}
+
+double shownNumber(const Conversion& conversion, double raw) {
+    const double number = raw * conversion.factor + conversion.offset;
+    return conversion.format->isReal() ? number : std::trunc(number);
+}
+
+void addLabel(std::vector<std::string>& labels, std::string_view label) {
+    if (!label.empty() && std::find(labels.begin(), labels.end(), label) == labels.end()) {
+        labels.emplace_back(label);
+    }
+}
+
+FieldInfo::Kind kindOf(const FieldDescription& field) {
+    if (field.shownAs.format != nullptr) {
+        return FieldInfo::Kind::Number;
+    }
+    if (!field.listKey.empty()) {
+        return FieldInfo::Kind::Object;
+    }
+    return field.position ? FieldInfo::Kind::Label : FieldInfo::Kind::Text;
+}
+
+/// What a row tells, added to what other rows of the field have told.
+void addRow(FieldInfo& info, const FieldDescription& field, LogCode logCode) {
+    const Conversion& conversion = field.shownAs;
+    if (info.unit.empty() && conversion.format != nullptr) {
+        info.unit = conversion.format->unit();
+    }
+    if (conversion.format != nullptr && field.position) {
+        const auto [rawLeast, rawMost] = rawRange(*field.position);
+        const double least = shownNumber(conversion, rawLeast);
+        const double most = shownNumber(conversion, rawMost);
+        info.least = std::min({least, most, info.least.value_or(least)});
+        info.most = std::max({least, most, info.most.value_or(most)});
+    }
+    for (const std::string_view label : conversion.labels) {
+        addLabel(info.labels, label);
+    }
+    addLabel(info.labels, conversion.exceptionalText);
+    addLabel(info.labels, conversion.beyond);
+    if (field.condition && field.condition->otherwise.find('%') == std::string_view::npos) {
+        addLabel(info.labels, field.condition->otherwise);
+    }
+    if (std::find(info.codes.begin(), info.codes.end(), logCode) == info.codes.end()) {
+        info.codes.push_back(logCode);
+    }
+    info.identifies = info.identifies || field.identifies;
+    info.isPersonal = info.isPersonal || field.isPersonal;
+    info.rows.push_back(field.row);
+}
+
+/// Walks the sections of a technology.
+class Gatherer {
+public:
+    explicit Gatherer(const TechnologyReference& technology)
+        : _technology(technology), _prefix(std::string(technology.technology->commandName) + ".") {}
+
+    std::vector<FieldInfo> gathered() {
+        for (const SectionReference& section : _technology.sections) {
+            _section = &section;
+            _name = _prefix + fieldWord(section.name);
+            _path = section.path;
+            for (const CodeDescription& code : section.codes) {
+                addCode(code);
+            }
+            for (const std::string& key : section.objectKeys) {
+                addObjectKey(key);
+            }
+        }
+        return std::move(_fields);
+    }
+
+private:
+    void addCode(const CodeDescription& code) {
+        const bool isEntries = code.listPart && code.listPart->isEntries();
+        const std::string path = _path;
+        _path += isEntries ? "/*" : "";
+        _isInList = isEntries;
+        addParts(code.fields, code.lists, code.logCode);
+        for (const SubpacketDescription& subpacket : code.subpackets) {
+            addParts(subpacket.fields, subpacket.lists, code.logCode);
+        }
+        _path = path;
+        _isInList = false;
+    }
+
+    void addParts(const std::vector<FieldDescription>& fields,
+                  const std::vector<ListDescription>& lists, LogCode logCode) {
+        for (const FieldDescription& field : fields) {
+            addRow(infoOf(field.key, kindOf(field)), field, logCode);
+        }
+        for (const ListDescription& list : lists) {
+            addList(list, logCode);
+        }
+    }
+
+    void addList(const ListDescription& list, LogCode logCode) {
+        const auto around = std::tuple(_name, _path, _isInList, _isShown);
+        if (!list.key.empty()) {
+            _name += "." + fieldWord(list.key);
+            _path += "/" + list.key;
+        }
+        _path += "/*";
+        _isInList = true;
+        _isShown = _isShown && list.isShown;
+        addParts(list.fields, list.lists, logCode);
+        std::tie(_name, _path, _isInList, _isShown) = around;
+    }
+
+    void addObjectKey(const std::string& key) {
+        const std::string path = _path;
+        _isInList = _section->isList;
+        _path += _isInList ? "/*" : "";
+        (void)infoOf(key, FieldInfo::Kind::Text);
+        _path = path;
+        _isInList = false;
+    }
+
+    /// The field of that key here, made if it is the first row of it.
+    FieldInfo& infoOf(const std::string& key, FieldInfo::Kind kind) {
+        std::string name = key.empty() ? _name : _name + "." + fieldWord(key);
+        const auto found = std::find_if(_fields.begin(), _fields.end(),
+                                        [&](const FieldInfo& each) { return each.name == name; });
+        if (found != _fields.end()) {
+            found->isShown = found->isShown || _isShown;
+            return *found;
+        }
+        FieldInfo& info = _fields.emplace_back();
+        info.name = std::move(name);
+        info.path = key.empty() ? _path : _path + "/" + key;
+        info.section = _section->name;
+        info.key = key;
+        info.kind = kind;
+        info.meaning = _technology.meaningOf(_section->name, key);
+        info.isInList = _isInList;
+        info.isShown = _isShown;
+        return info;
+    }
+
+    const TechnologyReference& _technology;
+    std::string _prefix;
+    std::vector<FieldInfo> _fields;
+    const SectionReference* _section = nullptr;
+    std::string _name;
+    std::string _path;
+    bool _isInList = false;
+    bool _isShown = true;
+};
+
+} // namespace
+
+FieldRegistry::FieldRegistry(const TechnologyReference& technology)
+    : _fields(Gatherer(technology).gathered()) {
+    for (std::size_t index = 0; index < _fields.size(); ++index) {
+        _byName.emplace(_fields[index].name, index);
+        for (const FieldId row : _fields[index].rows) {
+            _byRow.emplace(row, index);
+        }
+    }
+}
+
+const FieldInfo* FieldRegistry::ofRow(FieldId row) const {
+    const auto found = _byRow.find(row);
+    return found != _byRow.end() ? &_fields[found->second] : nullptr;
+}
+
+const FieldInfo* FieldRegistry::named(std::string_view name) const {
+    const auto found = _byName.find(name);
+    return found != _byName.end() ? &_fields[found->second] : nullptr;
+}
+
+std::string fieldWord(std::string_view text) {
+    std::string word;
+    for (const char character : text) {
+        const bool isCapital = character >= 'A' && character <= 'Z';
+        const bool isWord = isCapital || (character >= 'a' && character <= 'z') ||
+                            (character >= '0' && character <= '9');
+        if (isWord) {
+            word.push_back(isCapital ? static_cast<char>(character - 'A' + 'a') : character);
+        } else if (!word.empty() && word.back() != '_') {
+            word.push_back('_');
+        }
+    }
+    return !word.empty() && word.back() == '_' ? word.substr(0, word.size() - 1) : word;
+}
+
+} // namespace pallax
