@@ -7,8 +7,8 @@
 
 namespace pallax {
 
-/// What a display key tells, in one sentence; with an empty key, what its section tells. The keys
-/// of a list within a section belong to the section, too.
+/// What a display key tells whose layout does not say it, in one sentence; with an empty key, what
+/// its section tells. The keys of a list within a section belong to the section, too.
 struct Meaning {
     std::string_view section; ///< of CDMA: the path in the template, "1x / Receiver 0"
     std::string_view key;
@@ -31,7 +31,6 @@ Meanings cdmaMeanings();
 Meanings commonMeanings();
 Meanings gsmMeanings();
 Meanings ifxMeanings();
-Meanings lteMeanings();
 Meanings utranMeanings();
 
 } // namespace pallax

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/C2K/C2KLogGenerator.h"
 #include "LogGenerator/LTE/LTEClassIndex.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 #include "LogGenerator/UTRAN/UTRANClassIndex.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
 #include "fields/IfxSections.h"
@@ -52,6 +53,9 @@ void appendSections(const Dictionary& entries, const ClassIndex& index, const st
             sections.push_back({std::string(record->getSectionName()), path,
                                 record->sectionKind() == SectionKind::List,
                                 describe(*record, index)});
+            if (const auto* withLayout = dynamic_cast<const LayoutRecord*>(record)) {
+                sections.back().meaning = withLayout->layout().meaning;
+            }
         } else if (const DictionaryRef inner = entry.value.dictionary()) {
             appendSections(*inner, index, path, sections);
         }
@@ -151,18 +155,22 @@ std::vector<SectionReference> ifxSectionsOf(const Resources& /*resources*/) {
     return ifxSections();
 }
 
+Meanings noMeanings() {
+    return {};
+}
+
 struct Source {
     std::string_view commandName;
     std::string_view title;
     std::vector<SectionReference> (*sections)(const Resources& resources);
-    Meanings (*meanings)();
+    Meanings (*meanings)(); ///< those that stand in no layout
 };
 
 constexpr auto kSources = std::to_array<Source>({
     {"ifx", "IFX", ifxSectionsOf, ifxMeanings},
     {"gsm", "GSM/UMTS", gsmSections, gsmMeanings},
     {"cdma", "CDMA", cdmaSections, cdmaMeanings},
-    {"lte", "LTE", lteSections, lteMeanings},
+    {"lte", "LTE", lteSections, noMeanings},
     {"utran", "UTRAN", utranSections, utranMeanings},
 });
 
@@ -179,6 +187,54 @@ std::string_view sentenceOf(const Meanings& meanings, std::string_view section,
             return meaning.section == section && meaning.key == key;
         });
     return found != meanings.keys.end() ? found->sentence : std::string_view();
+}
+
+std::string_view sentenceOf(const std::vector<FieldDescription>& fields,
+                            const std::vector<ListDescription>& lists, std::string_view key) {
+    for (const FieldDescription& field : fields) {
+        if (field.key == key && !field.meaning.empty()) {
+            return field.meaning;
+        }
+    }
+    for (const ListDescription& list : lists) {
+        const bool isList = list.key == key && !list.meaning.empty();
+        const std::string_view sentence =
+            isList ? list.meaning : sentenceOf(list.fields, list.lists, key);
+        if (!sentence.empty()) {
+            return sentence;
+        }
+    }
+    return {};
+}
+
+/// The sentence of the section's first row under that key that has one.
+std::string_view sentenceOf(const SectionReference& section, std::string_view key) {
+    if (key.empty()) {
+        return section.meaning;
+    }
+    for (const CodeDescription& code : section.codes) {
+        std::string_view sentence = sentenceOf(code.fields, code.lists, key);
+        for (const SubpacketDescription& subpacket : code.subpackets) {
+            if (sentence.empty()) {
+                sentence = sentenceOf(subpacket.fields, subpacket.lists, key);
+            }
+        }
+        if (!sentence.empty()) {
+            return sentence;
+        }
+    }
+    return {};
+}
+
+std::string_view nameIn(const std::vector<SectionReference>& sections, LogCode logCode) {
+    for (const SectionReference& section : sections) {
+        for (const CodeDescription& code : section.codes) {
+            if (code.logCode == logCode && !code.name.empty()) {
+                return code.name;
+            }
+        }
+    }
+    return {};
 }
 
 std::string_view nameIn(const Meanings& meanings, LogCode logCode) {
@@ -205,13 +261,22 @@ Meanings meaningsOf(const TechnologyReference& technology) {
 
 std::string_view TechnologyReference::meaningOf(std::string_view section,
                                                 std::string_view key) const {
-    const std::string_view own = sentenceOf(meaningsOf(*this), section, key);
-    return !own.empty() ? own : sentenceOf(commonMeanings(), section, key);
+    const auto found =
+        std::find_if(sections.begin(), sections.end(),
+                     [section](const SectionReference& each) { return each.name == section; });
+    std::string_view sentence = found != sections.end() ? sentenceOf(*found, key) : "";
+    if (sentence.empty()) {
+        sentence = sentenceOf(meaningsOf(*this), section, key);
+    }
+    return !sentence.empty() ? sentence : sentenceOf(commonMeanings(), section, key);
 }
 
 std::string_view TechnologyReference::nameOf(LogCode logCode) const {
-    const std::string_view own = nameIn(meaningsOf(*this), logCode);
-    return !own.empty() ? own : nameIn(commonMeanings(), logCode);
+    std::string_view name = nameIn(sections, logCode);
+    if (name.empty()) {
+        name = nameIn(meaningsOf(*this), logCode);
+    }
+    return !name.empty() ? name : nameIn(commonMeanings(), logCode);
 }
 
 std::vector<LogCode> codesOf(const TechnologyReference& technology) {

@@ -22,6 +22,8 @@ struct SectionReference {
     std::vector<CodeDescription> codes = {};
     /// IFX: the keys, which no log code carries.
     std::vector<std::string> objectKeys = {};
+    /// Of the section: a sentence, where its layout holds one.
+    std::string_view meaning = {};
 };
 
 struct TechnologyReference {
@@ -39,7 +41,8 @@ struct TechnologyReference {
 /// templates, which `resources` holds.
 std::vector<TechnologyReference> gatherReference(const Resources& resources);
 
-/// The sentences of a technology, without those that several have in common.
+/// The sentences of a technology that stand in no layout, without those that several have in
+/// common.
 Meanings meaningsOf(const TechnologyReference& technology);
 
 /// The codes of a technology that some section reads, ascending, each once.

@@ -40,6 +40,7 @@ ListDescription describe(const ListLayout& layout) {
     list.staysWithoutEntries = layout.staysWithoutEntries;
     list.isShown = layout.isShown;
     list.rememberedAs = layout.rememberedAs;
+    list.meaning = layout.meaning;
     return list;
 }
 
@@ -61,6 +62,7 @@ CodeDescription describe(const CodeLayout& layout) {
                                             part->words};
     }
     code.note = layout.note;
+    code.name = layout.name;
     return code;
 }
 
@@ -121,6 +123,7 @@ FieldDescription describeField(const Field& field) {
     description.condition = copyOf(field.condition);
     description.identifies = field.identifies;
     description.isPersonal = field.isPersonal;
+    description.meaning = field.meaning;
     return description;
 }
 

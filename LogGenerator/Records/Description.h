@@ -40,6 +40,7 @@ struct FieldDescription {
     FieldId row = 0; ///< in the technology's numbering of its rows
     bool identifies = false;
     bool isPersonal = false;
+    std::string_view meaning = {}; ///< a sentence; empty where another row of the section has it
 };
 
 /// Repeated entries.
@@ -73,6 +74,7 @@ struct ListDescription {
     bool isShown = true; ///< false: read, and kept from the display
     /// Of a list that is remembered for other records, its second field by its first: as what.
     std::string_view rememberedAs = {};
+    std::string_view meaning = {}; ///< of a list with a key: a sentence
 };
 
 /// Of which part of a property list the fields of a record are.
@@ -109,6 +111,7 @@ struct CodeDescription {
     std::optional<ListPartDescription> listPart =
         std::nullopt;           ///< of a record that is a property list
     std::string_view note = {}; ///< what else the record does: whole sentences
+    std::string_view name = {}; ///< of the log record; empty where another section names it
 };
 
 using RecordDescription = std::vector<CodeDescription>;

@@ -25,8 +25,7 @@ constexpr Condition kIsKnownVersion{u8At(13), 1, 1, kUnknownMode};
 constexpr std::string_view kStateKey = "State";
 
 constexpr auto kFields = std::to_array<Field>({
-    Field{kStateKey, kMode, Conversion::label(kModes, kUnknownMode),
-          "State of the radio resource control."}
+    Field{kStateKey, kMode, Conversion::label(kModes, kUnknownMode), "State of the RRC connection."}
         .when(kIsKnownVersion),
 });
 

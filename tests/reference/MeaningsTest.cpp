@@ -30,7 +30,7 @@ TEST(Meanings, EveryKeyAndSectionThatIsDescribedHasOne) {
             for (const std::string& key : keys) {
                 EXPECT_TRUE(isSentence(technology.meaningOf(section, key)))
                     << technology.title << ", section \"" << section << "\", key \"" << key
-                    << "\": add a sentence to its table in reference/meanings";
+                    << "\": add a sentence to its row in the layout";
             }
         }
     }
@@ -71,6 +71,56 @@ TEST(Meanings, NoKeyHasTwo) {
         std::set<LogCode> codes;
         for (const CodeName& code : meanings.codes) {
             EXPECT_TRUE(codes.insert(code.logCode).second) << std::hex << code.logCode;
+        }
+    }
+}
+
+/// Key to the different sentences that the rows of a section have for it.
+using Sentences = std::map<std::string, std::set<std::string_view>>;
+
+void addSentences(Sentences& sentences, const std::vector<FieldDescription>& fields) {
+    for (const FieldDescription& field : fields) {
+        if (!field.meaning.empty()) {
+            sentences[field.key].insert(field.meaning);
+        }
+    }
+}
+
+Sentences sentencesOf(const SectionReference& section) {
+    Sentences sentences;
+    for (const CodeDescription& code : section.codes) {
+        addSentences(sentences, code.fields);
+        for (const SubpacketDescription& subpacket : code.subpackets) {
+            addSentences(sentences, subpacket.fields);
+        }
+        doubles::forEachList(code, [&sentences](const ListDescription& list) {
+            addSentences(sentences, list.fields);
+            if (!list.meaning.empty()) {
+                sentences[list.key].insert(list.meaning);
+            }
+        });
+    }
+    return sentences;
+}
+
+TEST(Meanings, TheLayoutsOfASectionSayOneOfEachKey) {
+    for (const TechnologyReference& technology : doubles::reference()) {
+        for (const SectionReference& section : technology.sections) {
+            for (const auto& [key, sentences] : sentencesOf(section)) {
+                EXPECT_EQ(sentences.size(), 1U) << section.name << ", " << key;
+                EXPECT_FALSE(key.empty()) << section.name << ": " << *sentences.begin();
+            }
+        }
+    }
+}
+
+TEST(Meanings, TheLayoutsOfATechnologyNameALogCodeOnce) {
+    for (const TechnologyReference& technology : doubles::reference()) {
+        std::set<LogCode> named;
+        for (const SectionReference& section : technology.sections) {
+            for (const CodeDescription& code : section.codes) {
+                EXPECT_TRUE(code.name.empty() || named.insert(code.logCode).second) << code.name;
+            }
         }
     }
 }
