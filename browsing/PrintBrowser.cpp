@@ -25,11 +25,16 @@ PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecor
     : _source(std::move(source)), _afterReconnect(afterReconnect), _notices(output),
       _link(std::move(directory), onFatalRecord, child, _notices),
       _printer(output, _link.clock(), [this] { return _model->topLevelNodes(); }),
-      _model(std::make_unique<PallaxModel>(_link.modelPlatform(*this))) {}
+      _model(makeModel()) {}
 
 PrintBrowser::~PrintBrowser() {
     FilePreferences preferences(FilePreferences::userFolder());
     setGSMRSSI(preferences, false);
+}
+
+std::unique_ptr<PallaxModel> PrintBrowser::makeModel() {
+    ModelObserver& observer = *this;
+    return std::make_unique<PallaxModel>(_link.platform(), observer);
 }
 
 bool PrintBrowser::run() {
@@ -74,7 +79,7 @@ void PrintBrowser::generatorChosen(const std::string& /*technology*/, bool keeps
     complain("The link was restarted: the display starts afresh.");
     _link.queue().async([this] { // not from within the model
         _model.reset();          // the name of its port is free for the next one's
-        _model = std::make_unique<PallaxModel>(_link.modelPlatform(*this));
+        _model = makeModel();
         _displayAge = {};
         _printer.startAfresh();
         start();

@@ -42,6 +42,7 @@ private:
 
     void updateViewControllerFromModel() override;
     void generatorChosen(const std::string& technology, bool keepsDisplay) override;
+    std::unique_ptr<PallaxModel> makeModel();
     void start();
     void look();
 

@@ -84,7 +84,7 @@ PallaxApp::Surroundings ScreenBrowser::applicationSurroundings(const Settings& s
                                          _link.present(),
                                          [this](ModelObserver& observer) {
                                              auto model = std::make_unique<PallaxModel>(
-                                                 _link.modelPlatform(observer));
+                                                 _link.platform(), observer);
                                              _model = model.get();
                                              return model;
                                          }};

@@ -21,16 +21,15 @@ BrowseLink::BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, C
       _socketPorts(_queue, std::move(directory), &_clock),
       _telephony(_socketPorts, _controlPortName),
       _linkPorts({_socketPorts, _telephony,
-                  formatText("%@.Viewer.%d", {PallaxModel::kLocalPortName, ::getpid()}),
+                  formatText("%@.Viewer.%d", {ModemLink::kLocalPortName, ::getpid()}),
                   [this] { return _socketPorts.lastError(); },
                   [this] { return _socketPorts.isTaken(_controlPortName); }}),
       _ports(_linkPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
       _resources(DirectoryResources::programFolder()) {}
 
-PallaxModel::Platform BrowseLink::modelPlatform(ModelObserver& observer) {
-    return {
-        _ports,         _linkPorts, _queue,        _clock, {_clock, _resources, _bundle, _notices},
-        technologies(), observer,   _localPortName};
+ModemLink::Platform BrowseLink::platform() {
+    return {_ports,         _linkPorts,    _queue, _clock, {_clock, _resources, _bundle, _notices},
+            technologies(), _localPortName};
 }
 
 bool BrowseLink::childHasEnded() const {

@@ -8,7 +8,7 @@
 #include "host/SourceClock.h"
 #include "host/WallClock.h"
 #include "link/LinkPorts.h"
-#include "monitor/PallaxModel.h"
+#include "monitor/ModemLink.h"
 #include "telephony/SocketTelephonyService.h"
 
 #include <chrono>
@@ -30,13 +30,12 @@ public:
     /// made of `localPortName`. Where that name is taken, the link has another for this process
     /// (see LinkPorts). What is referred to outlives the link.
     BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-               StandardOutput& notices,
-               std::string_view localPortName = PallaxModel::kLocalPortName);
+               StandardOutput& notices, std::string_view localPortName = ModemLink::kLocalPortName);
 
     AsioMainQueue& queue() { return _queue; }
     SourceClock& clock() { return _clock; }
     const Clock& present() const { return _wallClock; }
-    PallaxModel::Platform modelPlatform(ModelObserver& observer);
+    ModemLink::Platform platform();
     /// See LinkPorts.
     const std::string& obstacle() const { return _linkPorts.obstacle(); }
 

@@ -1,22 +1,15 @@
 #pragma once
 
-#include "LogGenerator/LogGenerator.h"
 #include "app/tree/PallaxModelNode.h"
-#include "platform/MessagePort.h"
-#include "platform/RepeatingTimer.h"
+#include "monitor/ModemLink.h"
 #include "plist/PropertyList.h"
-#include "plist/PropertyListCodec.h"
 
 #include <chrono>
 #include <memory>
-#include <span>
 #include <string>
 #include <string_view>
 
 namespace pallax {
-
-class MainQueue;
-class TelephonyService;
 
 /// What the model asks of the application object.
 class ModelObserver {
@@ -29,45 +22,33 @@ public:
     virtual void generatorChosen(const std::string& /*technology*/, bool /*keepsDisplay*/) {}
 };
 
-/// The spine of the system: owns the link to the baseband, chooses the log generator, feeds it
-/// every packet, and drives the display refresh every 2 seconds. Whatever fails while starting
-/// tears the link down and is tried again 5 seconds later, forever.
-class PallaxModel {
+/// The spine of the system: the display model on top of the link to the baseband. It feeds the
+/// link's generator every packet and drives the display refresh every 2 seconds.
+class PallaxModel final : private ModemLinkClient {
 public:
-    static constexpr std::string_view kLocalPortName = "com.norvane.BasebandStateReport.LogChannel";
-    static constexpr std::chrono::seconds kDisplayInterval{2};
-    static constexpr std::chrono::seconds kRetryDelay{5};
+    static constexpr std::chrono::seconds kDisplayInterval = ModemLink::kDisplayInterval;
+    static constexpr std::chrono::seconds kRetryDelay = ModemLink::kRetryDelay;
 
-    /// All of it outlives the model.
-    struct Platform {
-        MessagePorts& ports;
-        TelephonyService& telephony;
-        MainQueue& queue;
-        TimerScheduler& timers;
-        GeneratorEnvironment generators;
-        std::span<const Technology> technologies;
-        ModelObserver& observer;
-        std::string_view localPortName = kLocalPortName;
-        std::chrono::nanoseconds retryDelay = kRetryDelay;
-        /// How commands are written.
-        Result<std::string, CodecError> (*serialize)(const PropertyList&) = serializeXml;
-    };
+    using Platform = ModemLink::Platform;
 
-    explicit PallaxModel(const Platform& platform);
-    ~PallaxModel();
+    /// Starts nothing. The observer outlives the model.
+    PallaxModel(const Platform& platform, ModelObserver& observer);
+    ~PallaxModel() override = default;
     PallaxModel(const PallaxModel&) = delete;
     PallaxModel& operator=(const PallaxModel&) = delete;
 
-    void startMonitor();
-    void restartMonitor();
-    bool createPorts();
-    void destroyPorts();
-    void configureGenerator();
-    bool isConnected() const;
+    // Those of the link.
+    void startMonitor() { _link.startMonitor(); }
+    void restartMonitor() { _link.restartMonitor(); }
+    bool createPorts() { return _link.createPorts(); }
+    void destroyPorts() { _link.destroyPorts(); }
+    void configureGenerator() { _link.configureGenerator(); }
+    bool isConnected() const { return _link.isConnected(); }
 
     /// One packet of the log channel. An exception of a record leaves through here.
     void updateWithData(Bytes data);
-    void refresh();
+    /// Looks after the link, and after new data drops the tree and tells the observer.
+    void refresh() { _link.refresh(); }
 
     /// The root of the display tree; null while there is no generator. The caller may keep it
     /// beyond the next refresh.
@@ -81,19 +62,20 @@ public:
     PropertyList display();
 
 private:
-    void retryLater();
-    void packetReceived(std::int32_t identifier, Bytes data);
-    void portInvalidated(const MessagePort& port);
+    void setGenerator(std::unique_ptr<LogGenerator> generator) override;
+    const LogGenerator* generator() const override { return _logGenerator.get(); }
+    void generatorChosen(const std::string& technology) override;
+    void packetArrived(Bytes packet) override { updateWithData(packet); }
+    void displayTick() override;
 
-    Platform _platform;
-    std::unique_ptr<LocalMessagePort> _recvPort;
-    std::unique_ptr<RemoteMessagePort> _sendPort;
-    std::unique_ptr<RepeatingTimer> _displayUpdateTimer;
-    bool _updated = false;
+    MainQueue& _queue;
+    ModelObserver& _observer;
     std::unique_ptr<LogGenerator> _logGenerator;
+    bool _updated = false;
     Dictionary _state;
     NodeRef _nodes;
     std::unique_ptr<PathDictionary> _nodesByPath;
+    ModemLink _link;
     /// Blocks on the queue hold it weakly: after the model's end they do nothing.
     std::shared_ptr<PallaxModel*> _alive;
 };

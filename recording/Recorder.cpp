@@ -2,8 +2,6 @@
 
 #include "host/Recording.h"
 #include "link/WaitNotice.h"
-#include "plist/PropertyListCodec.h"
-#include "telephony/ControlMessages.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -20,13 +18,12 @@ constexpr std::chrono::seconds kProgressInterval{1};
 
 /// A name of its own, so that a viewer and other recorders may run at the same time.
 std::string localPortName() {
-    return formatText("%@.Recorder.%d", {PallaxModel::kLocalPortName, ::getpid()});
+    return formatText("%@.Recorder.%d", {ModemLink::kLocalPortName, ::getpid()});
 }
 
-/// Null when the reply names none of the known technologies.
-const RecordedTechnology* technologyIn(Bytes reply) {
-    const auto message = decodeMessage(reply);
-    const auto identifier = message ? stringIn(*message, "GetTechnology") : std::nullopt;
+/// Null when the answer is none of the known technologies.
+const RecordedTechnology* technologyOf(const PropertyList& answer) {
+    const auto identifier = answer.string();
     const auto all = recordedTechnologies();
     const auto found = std::find_if(all.begin(), all.end(), [&](const RecordedTechnology& each) {
         return identifier == each.identifier;
@@ -40,44 +37,42 @@ Recorder::Recorder(SocketDirectory directory, const RecordedTechnology* wanted,
                    RecordingFiles& files, Progress progress, Progress waits)
     : _wanted(wanted), _files(files), _progress(std::move(progress)), _waits(std::move(waits)),
       _link(std::move(directory), OnFatalRecord::Skip, nullptr, _notices, localPortName()),
-      _browsing(_link.modelPlatform(*this)), _ports(_browsing.ports, *this), _model(platform()) {}
+      _modem(platform(), *this) {}
 
-/// A viewer's, but for the ports and the delay: what is not recorded meanwhile is lost.
-PallaxModel::Platform Recorder::platform() {
-    return {_ports,
-            _browsing.telephony,
-            _browsing.queue,
-            _browsing.timers,
-            _browsing.generators,
-            _browsing.technologies,
-            _browsing.observer,
-            _browsing.localPortName,
-            kRetryDelay};
+/// A viewer's with a shorter delay, because packets that come meanwhile are lost.
+ModemLink::Platform Recorder::platform() {
+    ModemLink::Platform viewers = _link.platform();
+    viewers.retryDelay = kRetryDelay;
+    return viewers;
 }
 
 std::optional<std::string> Recorder::run() {
     AsioMainQueue& queue = _link.queue();
     queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [&queue](int /*signal*/) { queue.stop(); });
     _link.clock().onEnd([&queue] { queue.stop(); });
-    queue.async([this] { _model.startMonitor(); });
+    queue.async([this] { _modem.startMonitor(); });
     const auto looks = queue.scheduleRepeating(kProgressInterval, [this] { tellProgress(); });
-    const WaitNotice notice({queue, [this] { return _model.isConnected(); },
+    const WaitNotice notice({queue, [this] { return _modem.isConnected(); },
                              [this] { return _link.obstacle(); }, _waits});
     queue.run();
     return _failure;
 }
 
-bool Recorder::replied(Bytes reply) {
-    const RecordedTechnology* technology = technologyIn(reply);
+bool Recorder::wantsTechnology(const PropertyList& answer) {
+    const RecordedTechnology* technology = technologyOf(answer);
     if (technology != nullptr && _wanted != nullptr && technology != _wanted) {
         fail(formatText("The modem's technology is %@ (%@), not %@.",
                         {technology->identifier, technology->commandName, _wanted->commandName}));
         return false;
     }
-    if (technology != nullptr) { // otherwise, as for the model, the earlier one stays
+    if (technology != nullptr) { // the link starts with no other one
         _technology = technology;
     }
     return true;
+}
+
+void Recorder::setGenerator(std::unique_ptr<LogGenerator> generator) {
+    _generator = std::move(generator);
 }
 
 void Recorder::packetArrived(Bytes packet) {
@@ -107,7 +102,7 @@ void Recorder::stop() {
 void Recorder::tellProgress() {
     const std::uint64_t packets = _files.packets();
     _progress(
-        progressText(_files, packets - std::exchange(_packetsTold, packets), _model.isConnected()));
+        progressText(_files, packets - std::exchange(_packetsTold, packets), _modem.isConnected()));
 }
 
 std::string Recorder::failureText(const HostError& error, const RecordingFiles& files) {

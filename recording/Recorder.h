@@ -1,25 +1,24 @@
 #pragma once
 
 #include "link/BrowseLink.h"
-#include "monitor/PallaxModel.h"
+#include "monitor/ModemLink.h"
 #include "platform/StandardOutput.h"
 #include "recording/RecordOptions.h"
 #include "recording/RecordingFiles.h"
-#include "recording/RecordingPorts.h"
 
 #include <chrono>
 #include <cstdint>
 #include <functional>
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
 
 namespace pallax {
 
-/// Records what a viewer would be shown: a model opens the log channel and keeps it open, and the
-/// packets go into files instead of into a display, each with the stamp
-/// that the source sent.
-class Recorder final : private LinkListener, private ModelObserver {
+/// Records what a viewer would be shown: over a viewer's link to the modem the packets go into
+/// files instead of into a display, each with the stamp that the source sent.
+class Recorder final : private ModemLinkClient {
 public:
     /// Gets, about once a second, how far it has come.
     using Progress = std::function<void(const std::string& text)>;
@@ -46,10 +45,11 @@ private:
         void printLine(std::string_view /*line*/) override {}
     };
 
-    bool replied(Bytes reply) override;
+    bool wantsTechnology(const PropertyList& answer) override;
+    void setGenerator(std::unique_ptr<LogGenerator> generator) override;
+    const LogGenerator* generator() const override { return _generator.get(); }
     void packetArrived(Bytes packet) override;
-    void updateViewControllerFromModel() override {}
-    PallaxModel::Platform platform();
+    ModemLink::Platform platform();
     void tellProgress();
     void fail(std::string sentence);
     void stop();
@@ -64,9 +64,8 @@ private:
     std::uint64_t _packetsTold = 0;
     NoNotices _notices;
     BrowseLink _link;
-    PallaxModel::Platform _browsing;
-    RecordingPorts _ports;
-    PallaxModel _model;
+    std::unique_ptr<LogGenerator> _generator; // only for its start command
+    ModemLink _modem;
 };
 
 } // namespace pallax

@@ -36,10 +36,9 @@ constexpr auto kCellFields = std::to_array<Field>({
      "Frame timing of the neighbour at antenna 0, as the modem counts it."},
     {"Ant 0 Sample Offset", kSampleOffset, Conversion::number(),
      "Sample timing of the neighbour at antenna 0, as the modem counts it."},
-    {"Ant 1 Frame Offset", kFrameOffset, Conversion::number(),
-     "Frame timing of antenna 0 once more."},
+    {"Ant 1 Frame Offset", kFrameOffset, Conversion::number(), "Frame timing of antenna 0 again."},
     {"Ant 1 Sample Offset", kSampleOffset, Conversion::number(),
-     "Sample timing of antenna 0 once more."},
+     "Sample timing of antenna 0 again."},
 });
 static_assert(kCellFields.size() == 12);
 

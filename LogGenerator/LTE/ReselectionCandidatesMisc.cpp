@@ -25,7 +25,7 @@ constexpr auto kCodes = std::to_array<CodeLayout>({{
 constexpr RecordLayout kLayout{
     .section = "Reselection Candidates",
     .logLine = "Reselection Candidates",
-    .meaning = "From where the phone looks for a cell to reselect.",
+    .meaning = "The serving cell from which the phone may reselect.",
     .codes = kCodes,
 };
 

@@ -52,8 +52,7 @@ constexpr auto kFields = std::to_array<Field>({
     {"Measurement Rules Updated", bitsAt(32, 1, 1), Conversion::flag("True", "False"),
      "Whether the measurement rules have changed."},
     {"Measurement Rules", bitsAt(32, 2, 4), Conversion::number(),
-     "Number of the measurement rules that are in force; no meaning of the single values is "
-     "known."},
+     "Number of the measurement rules that are in force; the meaning of the values is not known."},
 });
 static_assert(kFields.size() == 18);
 

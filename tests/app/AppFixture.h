@@ -153,8 +153,8 @@ private:
                                   .queue = queue,
                                   .timers = queue,
                                   .generators = {clock, resources, bundle, standardOutput},
-                                  .technologies = spoken,
-                                  .observer = application});
+                                  .technologies = spoken},
+            application);
         appModel = made.get();
         return made;
     }

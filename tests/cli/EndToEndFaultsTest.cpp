@@ -1,4 +1,5 @@
 #include "link/BrowseLink.h"
+#include "monitor/PallaxModel.h"
 #include "tests/cli/EndToEnd.h"
 #include "tests/cli/FaultyService.h"
 #include "tests/doubles/FakeStandardOutput.h"
@@ -43,7 +44,7 @@ private:
 /// The viewer's side, real but for its screen and its patience: model, ports and sockets.
 class Viewer final : private ModelObserver {
 public:
-    Viewer() : _model(platform()) {
+    Viewer() : _model(platform(), *this) {
         _link.queue().async([this] { _model.startMonitor(); });
     }
 
@@ -79,11 +80,10 @@ private:
         }
         return std::move(opened).value();
     }
-    PallaxModel::Platform platform() {
-        const PallaxModel::Platform real = _link.modelPlatform(*this);
-        return {real.ports,    real.telephony,     real.queue,
-                _timers,       real.generators,    real.technologies,
-                real.observer, real.localPortName, kShortRetryDelay};
+    ModemLink::Platform platform() {
+        const ModemLink::Platform real = _link.platform();
+        return {real.ports,      real.telephony,    real.queue,         _timers,
+                real.generators, real.technologies, real.localPortName, kShortRetryDelay};
     }
     void updateViewControllerFromModel() override {
         ++_updates;

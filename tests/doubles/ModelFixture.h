@@ -148,9 +148,8 @@ protected:
                                    .queue = queue,
                                    .timers = timers,
                                    .generators = {clock, resources, bundle, standardOutput},
-                                   .technologies = kFakeTechnologies,
-                                   .observer = observer};
-    std::unique_ptr<PallaxModel> model = std::make_unique<PallaxModel>(platform);
+                                   .technologies = kFakeTechnologies};
+    std::unique_ptr<PallaxModel> model = std::make_unique<PallaxModel>(platform, observer);
 };
 
 } // namespace pallax::doubles

@@ -37,10 +37,10 @@ private:
 class LinkPortsTest : public doubles::ModelFixture {
 protected:
     LinkPortsTest() {
-        PallaxModel::Platform linked = platform;
         _model = std::make_unique<PallaxModel>(
-            PallaxModel::Platform{_link, _link, linked.queue, linked.timers, linked.generators,
-                                  linked.technologies, linked.observer});
+            PallaxModel::Platform{_link, _link, platform.queue, platform.timers,
+                                  platform.generators, platform.technologies},
+            observer);
     }
 
     /// The lines of priority 3 of a start that fails.

@@ -183,7 +183,7 @@ TEST_F(PallaxModelFailureTest, AQueryThatCannotBeWrittenLeavesTheGeneratorUnset)
     platform.serialize = [](const PropertyList&) -> Result<std::string, CodecError> {
         return CodecError{0, "nothing can be written today"};
     };
-    model = std::make_unique<PallaxModel>(platform);
+    model = std::make_unique<PallaxModel>(platform, observer);
     start();
     const Diary logged = errors();
     ASSERT_EQ(logged.size(), 3U);

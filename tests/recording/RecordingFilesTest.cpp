@@ -13,7 +13,7 @@ namespace {
 
 using std::chrono::seconds;
 
-constexpr Time kFirstStamp{seconds(1700000000)};
+constexpr Time kPacketTime{seconds(1700000000)};
 constexpr std::size_t kEmptyFile = 92; // section and interface
 
 class RecordingFilesTest : public testing::Test {
@@ -25,7 +25,7 @@ protected:
     }
     std::optional<HostError> add(RecordingFiles& files, seconds sinceStart,
                                  std::size_t length = 4) const {
-        return files.add(*technology, kFirstStamp + sinceStart, ByteBuffer(length));
+        return files.add(*technology, kPacketTime + sinceStart, ByteBuffer(length));
     }
     int packetsIn(const std::string& name) const {
         const auto recording = Recording::open(folder.file(name));

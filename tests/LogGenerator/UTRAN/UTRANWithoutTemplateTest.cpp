@@ -89,8 +89,8 @@ protected:
                                   .queue = queue,
                                   .timers = queue,
                                   .generators = {clock, resources, bundle, standardOutput},
-                                  .technologies = technologies(),
-                                  .observer = observer});
+                                  .technologies = technologies()},
+            observer);
     }
 };
 
