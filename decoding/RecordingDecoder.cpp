@@ -8,10 +8,10 @@ namespace pallax {
 
 RecordingDecoder::RecordingDecoder(const DecoderEnvironment& environment,
                                    std::string_view technology, Every every, DisplayOutput& output)
-    : _every(every), _output(output),
-      _generator(LogGenerator::generatorFromTechnology(
-          Text(technology), environment.technologies,
-          {_clock, environment.resources, environment.bundle, environment.standardOutput})) {
+    : _every(every), _output(output) {
+    _driver.setGenerator(LogGenerator::generatorFromTechnology(
+        Text(technology), environment.technologies,
+        {_clock, environment.resources, environment.bundle, environment.standardOutput}));
     _output.beginRecording();
 }
 
@@ -23,19 +23,18 @@ std::optional<std::string> RecordingDecoder::add(const RecordedPacket& packet) {
     _lastPacket = packet.time;
     ++_packets;
     try {
-        _generator->updateState(_state, packet.data);
+        _driver.update(packet.data);
     } catch (const TemplateFailure&) {
         throw;
     } catch (const std::exception& error) {
         return error.what();
     }
-    _updated = true;
     _unseenBytes += packet.data.size();
     if (_unseenBytes > kMostUnseenBytes) {
         (void)generate(packet.time);
     }
     if (_every == Every::Packet) {
-        _output.show({_packets, packet.time}, liveDisplay());
+        _output.show({_packets, packet.time}, _driver.display());
     }
     return std::nullopt;
 }
@@ -45,15 +44,14 @@ void RecordingDecoder::finish() {
         tick(_grid.next());
     }
     if (_every == Every::End) {
-        _output.show({_packets, _lastPacket.value_or(Time())}, liveDisplay());
+        _output.show({_packets, _lastPacket.value_or(Time())}, _driver.display());
     }
 }
 
 void RecordingDecoder::tick(const TickGrid::Tick& tick) {
-    if (!_updated) {
+    if (!_driver.takeUpdated()) {
         return;
     }
-    _updated = false;
     const PropertyList display = generate(tick.time);
     if (_every == Every::Tick) {
         _output.show({tick.number, tick.time}, display);
@@ -63,11 +61,7 @@ void RecordingDecoder::tick(const TickGrid::Tick& tick) {
 PropertyList RecordingDecoder::generate(Time now) {
     _unseenBytes = 0;
     _clock.set(now);
-    return _generator->generateLogUsingState(_state);
-}
-
-PropertyList RecordingDecoder::liveDisplay() const {
-    return _generator->display(_state);
+    return _driver.generate();
 }
 
 } // namespace pallax

@@ -1,14 +1,13 @@
 #pragma once
 
-#include "LogGenerator/LogGenerator.h"
 #include "decoding/DisplayOutput.h"
 #include "decoding/TickGrid.h"
 #include "host/Recording.h"
+#include "monitor/DisplayDriver.h"
 #include "platform/Clock.h"
 
 #include <cstddef>
 #include <cstdint>
-#include <memory>
 #include <optional>
 #include <span>
 #include <string>
@@ -48,7 +47,7 @@ public:
                      Every every, DisplayOutput& output);
 
     /// False when no generator knows the technology; then there is nothing else to do.
-    bool hasGenerator() const { return _generator != nullptr; }
+    bool hasGenerator() const { return _driver.generator() != nullptr; }
 
     /// The reason why the packet was dropped, when a record has thrown; else nothing.
     /// TemplateFailure leaves.
@@ -63,17 +62,14 @@ public:
 private:
     void tick(const TickGrid::Tick& tick);
     PropertyList generate(Time now);
-    PropertyList liveDisplay() const;
 
     Every _every;
     DisplayOutput& _output;
     PacketClock _clock;
-    std::unique_ptr<LogGenerator> _generator;
-    Dictionary _state;
+    DisplayDriver _driver;
     TickGrid _grid;
     std::uint64_t _packets = 0;
     std::optional<Time> _lastPacket;
-    bool _updated = false; // since the last tick
     std::size_t _unseenBytes = 0;
 };
 

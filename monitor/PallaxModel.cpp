@@ -10,26 +10,14 @@ PallaxModel::PallaxModel(const Platform& platform, ModelObserver& observer)
     : _queue(platform.queue), _observer(observer), _link(platform, *this),
       _alive(std::make_shared<PallaxModel*>(this)) {}
 
-void PallaxModel::setGenerator(std::unique_ptr<LogGenerator> generator) {
-    _logGenerator = std::move(generator);
-}
-
 void PallaxModel::generatorChosen(const std::string& technology) {
-    _observer.generatorChosen(technology, _logGenerator->keepsDisplay(_state));
-}
-
-void PallaxModel::updateWithData(Bytes data) {
-    if (_logGenerator) {
-        _logGenerator->updateState(_state, data);
-    }
-    _updated = true;
+    _observer.generatorChosen(technology, _driver.keepsDisplay());
 }
 
 void PallaxModel::displayTick() {
-    if (!_updated) {
+    if (!_driver.takeUpdated()) {
         return;
     }
-    _updated = false;
     _nodes.reset();
     _nodesByPath.reset();
     _queue.async([model = std::weak_ptr(_alive)] {
@@ -43,12 +31,11 @@ NodeRef PallaxModel::topLevelNodes() {
     if (_nodes || _nodesByPath) { // paths without a root: the display was asked for, and is null
         return _nodes;
     }
-    if (!_logGenerator) {
+    if (_driver.generator() == nullptr) {
         return nullptr;
     }
-    const PropertyList display = _logGenerator->generateLogUsingState(_state);
     auto paths = std::make_unique<PathDictionary>();
-    _nodes = PallaxModelNode::makeTreeFromObject(display, *paths);
+    _nodes = PallaxModelNode::makeTreeFromObject(_driver.generate(), *paths);
     _nodesByPath = std::move(paths);
     return _nodes;
 }
@@ -62,14 +49,6 @@ NodeRef PallaxModel::nodeAtPath(std::string_view path) {
     }
     const auto found = _nodesByPath->find(std::string(path));
     return found != _nodesByPath->end() ? found->second : nullptr;
-}
-
-PropertyList PallaxModel::getSaveContents() const {
-    return _logGenerator ? _logGenerator->getSaveContentsFromState(_state) : PropertyList();
-}
-
-PropertyList PallaxModel::display() {
-    return _logGenerator ? _logGenerator->display(_state) : PropertyList();
 }
 
 } // namespace pallax

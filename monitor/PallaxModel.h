@@ -1,6 +1,7 @@
 #pragma once
 
 #include "app/tree/PallaxModelNode.h"
+#include "monitor/DisplayDriver.h"
 #include "monitor/ModemLink.h"
 #include "plist/PropertyList.h"
 
@@ -8,6 +9,7 @@
 #include <memory>
 #include <string>
 #include <string_view>
+#include <utility>
 
 namespace pallax {
 
@@ -46,7 +48,7 @@ public:
     bool isConnected() const { return _link.isConnected(); }
 
     /// One packet of the log channel. An exception of a record leaves through here.
-    void updateWithData(Bytes data);
+    void updateWithData(Bytes data) { _driver.update(data); }
     /// Looks after the link, and after new data drops the tree and tells the observer.
     void refresh() { _link.refresh(); }
 
@@ -57,22 +59,22 @@ public:
     NodeRef nodeAtPath(std::string_view path);
     /// The generator's save contents (an array), or null without a generator. The sections of their
     /// displays are the live ones, which are up to date after a call of `display`.
-    PropertyList getSaveContents() const;
+    PropertyList getSaveContents() const { return _driver.saveContents(); }
     /// The live display, with every packet that has arrived; null while there is none.
-    PropertyList display();
+    PropertyList display() { return _driver.display(); }
 
 private:
-    void setGenerator(std::unique_ptr<LogGenerator> generator) override;
-    const LogGenerator* generator() const override { return _logGenerator.get(); }
+    void setGenerator(std::unique_ptr<LogGenerator> generator) override {
+        _driver.setGenerator(std::move(generator));
+    }
+    const LogGenerator* generator() const override { return _driver.generator(); }
     void generatorChosen(const std::string& technology) override;
     void packetArrived(Bytes packet) override { updateWithData(packet); }
     void displayTick() override;
 
     MainQueue& _queue;
     ModelObserver& _observer;
-    std::unique_ptr<LogGenerator> _logGenerator;
-    bool _updated = false;
-    Dictionary _state;
+    DisplayDriver _driver;
     NodeRef _nodes;
     std::unique_ptr<PathDictionary> _nodesByPath;
     ModemLink _link;
