@@ -1,13 +1,11 @@
 #include "browsing/ScreenBrowser.h"
 
+#include "browsing/LinkNotes.h"
 #include "browsing/ZoneText.h"
-#include "decoding/StampSentence.h"
 #include "link/Settings.h"
-#include "link/WaitNotice.h"
 
 #include <chrono>
 #include <csignal>
-#include <filesystem>
 #include <utility>
 
 namespace pallax {
@@ -16,116 +14,75 @@ namespace {
 
 constexpr std::chrono::milliseconds kTurnInterval{150};
 
-/// Without the folder of a recording, for which a title has no room.
-std::string titleOf(const BrowsedSource& source) {
-    return std::filesystem::path(source.name).filename().string();
-}
-
 } // namespace
-
-bool ScreenBrowser::Files::writePropertyList(const std::string& path, const PropertyList& object) {
-    const bool isReplaced = _files.exists(path);
-    const bool isWritten = _files.writePropertyList(path, object);
-    if (isWritten) {
-        _frontEnd.setMessage((isReplaced ? "Replaced " : "Saved ") + path);
-    }
-    return isWritten;
-}
 
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
                              ChildService* child, BrowsedSource source, const Settings& settings,
                              terminal::CursesTerminal& terminal, StandardOutput& notices)
-    : _source(std::move(source)), _terminal(terminal),
-      _link(std::move(directory), onFatalRecord, child, notices),
+    : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, notices),
       _keys(_link.queue(), terminal.inputDescriptor()),
-      _frontEnd(frontEndSurroundings(), terminal.marks()), _files(_frontEnd),
-      _preferences(FilePreferences::userFolder()), _app(applicationSurroundings(settings)) {
-    _frontEnd.setOrigin({"", titleOf(_source)});
-}
-
-ScreenBrowser::~ScreenBrowser() {
-    _app.applicationWillTerminate();
-}
+      _frontEnd(frontEndSurroundings(), terminal.marks()),
+      _preferences(FilePreferences::userFolder()),
+      _session(sessionSurroundings(std::move(source), settings)) {}
 
 terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
     return {.needsDisplay = [this] { needsDisplay(); },
-            .quit = [this] { _link.queue().stop(); },
+            .quit = [this] { _session.quit(); },
             .copy = [this](const std::string& text) { _terminal.copy(text); },
             .repaint =
                 [this] {
                     _terminal.repaint();
                     needsDisplay();
                 },
-            .startAfresh = [this] { startAfresh(); },
+            .startAfresh = [this] { _session.startAfresh(); },
             .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); }};
 }
 
-void ScreenBrowser::startAfresh() {
-    if (_source.isReadOnce) {
-        return _frontEnd.setMessage("A stream can be played only once");
-    }
-    _frontEnd.setNote(""); // of what was played until now
-    _app.startAfresh();
-}
-
-void ScreenBrowser::linkChanged(const std::string& technology,
-                                const std::optional<Time>& valuesFrom) {
-    _frontEnd.setOrigin({technology, titleOf(_source)});
-    const DateFormatter time("HH:mm:ss", _link.clock());
-    _frontEnd.setOldValues(valuesFrom ? time.stringFromDate(*valuesFrom) : "");
-}
-
-PallaxApp::Surroundings ScreenBrowser::applicationSurroundings(const Settings& settings) {
-    PallaxApp::Surroundings surroundings{_frontEnd.toolkit(),
-                                         _files,
-                                         _preferences,
-                                         _link.queue(),
-                                         _link.clock(),
-                                         _link.present(),
-                                         [this](ModelObserver& observer) {
-                                             auto model = std::make_unique<PallaxModel>(
-                                                 _link.platform(), observer);
-                                             _model = model.get();
-                                             return model;
-                                         }};
-    surroundings.startsAfreshByItself = settings.afterReconnect == AfterReconnect::Fresh;
-    surroundings.linkChanged = [this](const auto& technology, const auto& valuesFrom) {
-        linkChanged(technology, valuesFrom);
-    };
-    if (settings.snapshotDirectory) {
-        surroundings.snapshotDirectory = *settings.snapshotDirectory;
-    }
-    if (settings.saveButtonMarker) {
-        surroundings.saveButtonMarker = *settings.saveButtonMarker;
-    }
-    return surroundings;
+BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource source,
+                                                                 const Settings& settings) {
+    return {.toolkit = _frontEnd.toolkit(),
+            .files = _files,
+            .preferences = _preferences,
+            .queue = _link.queue(),
+            .timers = _link.queue(),
+            .loop = _link.queue(),
+            .clock = _link.clock(),
+            .present = _link.present(),
+            .makeModel =
+                [this](ModelObserver& observer) {
+                    return std::make_unique<PallaxModel>(_link.platform(), observer);
+                },
+            .face = {.message = [this](const auto& text) { _frontEnd.setMessage(text); },
+                     .note = [this](const auto& text) { _frontEnd.setNote(text); },
+                     .origin =
+                         [this](const auto& technology, const auto& name) {
+                             _frontEnd.setOrigin({technology, name});
+                         },
+                     .oldValues = [this](const auto& time) { _frontEnd.setOldValues(time); }},
+            .source = std::move(source),
+            .isSourceGone = [this] { return _link.childHasEnded(); },
+            .lookInterval = BrowseLink::kLookInterval,
+            .snapshotDirectory = settings.snapshotDirectory,
+            .saveButtonMarker = settings.saveButtonMarker,
+            .startsAfreshByItself = settings.afterReconnect == AfterReconnect::Fresh};
 }
 
 bool ScreenBrowser::run() {
-    AsioMainQueue& queue = _link.queue();
-    // Behind SIGCONT the terminal may have another extent than before.
-    queue.onSignal({SIGINT, SIGTERM, SIGHUP, SIGQUIT, SIGWINCH, SIGCONT}, [this](int signal) {
-        if (signal == SIGWINCH || signal == SIGCONT) {
-            adoptSize();
-        } else {
-            _link.queue().stop();
-        }
-    });
-    _link.clock().onStampRemark([this](std::uint32_t packet, const StampRemark& remark) {
-        _frontEnd.setNote(stampNote(packet, remark));
-    });
-    if (_link.hasChild()) {
-        _link.clock().onEnd([this] { _frontEnd.setNote("End of the recording"); });
-    }
+    // After SIGCONT the terminal may have another extent than before.
+    _link.queue().onSignal({SIGINT, SIGTERM, SIGHUP, SIGQUIT, SIGWINCH, SIGCONT},
+                           [this](int signal) {
+                               if (signal == SIGWINCH || signal == SIGCONT) {
+                                   adoptSize();
+                               } else {
+                                   _session.quit();
+                               }
+                           });
+    const LinkNotes notes(
+        _link, [this] { return _session.isConnected(); },
+        [this](const std::string& text) { _frontEnd.setNote(text); });
     _frontEnd.resize(_terminal.columns(), _terminal.rows());
-    _app.applicationDidFinishLaunching();
     waitForKey();
-    const auto looks = queue.scheduleRepeating(BrowseLink::kLookInterval, [this] { look(); });
-    const WaitNotice notice({queue, [this] { return _model != nullptr && _model->isConnected(); },
-                             [this] { return _link.obstacle(); },
-                             [this](const std::string& text) { _frontEnd.setNote(text); }});
-    queue.run();
-    return !_childLost;
+    return _session.run();
 }
 
 void ScreenBrowser::waitForKey() {
@@ -138,7 +95,7 @@ void ScreenBrowser::readKey() {
         _frontEnd.handle(*key);
         _link.queue().async([this] { readKey(); });
     } else if (_terminal.isHungUp()) {
-        _link.queue().stop();
+        _session.quit();
     } else {
         waitForKey();
     }
@@ -168,16 +125,6 @@ void ScreenBrowser::keepTurning() {
 void ScreenBrowser::adoptSize() {
     _terminal.adoptSize();
     _frontEnd.resize(_terminal.columns(), _terminal.rows());
-}
-
-void ScreenBrowser::look() {
-    if (_link.childHasEnded()) {
-        // A signal to the whole process group may be on its way to us too.
-        _link.queue().after(BrowseLink::kLookInterval, [this] {
-            _childLost = true;
-            _link.queue().stop();
-        });
-    }
 }
 
 } // namespace pallax
