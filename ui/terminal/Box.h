@@ -8,9 +8,9 @@
 
 namespace pallax::terminal {
 
-/// A framed area; the extents count the frame.
+/// A framed area; its extents include the frame.
 struct Box {
-    /// What the frame takes of the rows, and of the columns.
+    /// Rows and columns of the frame, both sides together.
     static constexpr int kFrame = 2;
 
     int x = 0;
@@ -18,7 +18,7 @@ struct Box {
     int columns = 0;
     int rows = 0;
 
-    /// The columns between frame and one blank at either side.
+    /// The columns inside the frame and one blank on each side.
     Span inside() const { return {x + 2, x + columns - 2}; }
 };
 
@@ -28,10 +28,10 @@ Box centeredBox(const Grid& grid, int columns, int rows);
 /// Blanks the box and draws its frame, with the title in the upper edge.
 void drawBox(Grid& grid, const Marks& marks, const Box& box, std::string_view title);
 
-/// A button's face: "[ Text ]", or "[Text]" where room is scarce.
+/// A button's text: "[ Text ]", or "[Text]" if `isNarrow`.
 std::string buttonFace(std::string_view text, bool isNarrow = false);
 
-/// Draws a button ending before column `right`; where it begins is returned.
+/// Draws a button that ends before column `right`; returns its first column.
 int drawButton(Grid& grid, int right, int y, std::string_view face, bool hasFocus);
 
 } // namespace pallax::terminal

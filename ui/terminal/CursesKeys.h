@@ -7,16 +7,16 @@
 
 namespace pallax::terminal {
 
-/// A key code of the curses library; nothing for one without a meaning here. Mouse events are
-/// taken from the library's queue.
+/// The event of a curses key code; nothing for an unused code. Takes mouse events from the
+/// library's queue.
 std::optional<KeyEvent> keyOfCode(unsigned code);
 
-/// A character that was typed; what stands for a key becomes that key.
+/// The event of a typed character, some of which are keys.
 KeyEvent keyOfCharacter(char32_t character);
 
-/// The key of a control sequence that the terminal's description does not tell (terminals differ
-/// from what they say they are): "[" or "O", what stands between, and the final character. Nothing
-/// for one without a meaning here.
+/// The key of a control sequence that is missing in the terminal's description (terminals differ
+/// from their descriptions): "[" or "O", the parameters, and the final character. Nothing for an
+/// unused sequence.
 std::optional<KeyEvent> keyOfSequence(std::string_view parameters, char32_t final);
 
 } // namespace pallax::terminal

@@ -14,23 +14,23 @@ namespace pallax::terminal {
 
 enum class ColorUse { Auto, Always, Never };
 
-/// Why there is no terminal; one clear sentence.
+/// Why there is no terminal, in one sentence.
 struct TerminalError {
     std::string sentence;
 };
 
-/// The terminal that the process runs in, as long as this exists; its destruction restores it.
-/// Only one at a time. All of its output goes through the curses library.
+/// The terminal that the process runs in; the destructor restores it. Only one at a time. All of
+/// its output goes through the curses library.
 class CursesTerminal {
 public:
     struct Options {
-        ColorUse color = ColorUse::Auto; ///< Auto: unless NO_COLOR is set
+        ColorUse color = ColorUse::Auto; ///< Auto: colours unless NO_COLOR is set
         bool mouse = true;
     };
 
-    /// Keys come from the controlling terminal, so standard input may be something else.
+    /// Keys come from the controlling terminal, so standard input is free for other uses.
     static Result<std::unique_ptr<CursesTerminal>, TerminalError> open(const Options& options);
-    /// Whether this process may draw at all: standard output is a terminal that can be drawn on.
+    /// Whether standard output is a terminal that can be drawn on.
     static bool isPossible();
 
     ~CursesTerminal();
@@ -39,21 +39,21 @@ public:
 
     int columns() const;
     int rows() const;
-    /// ASCII only, unless the user's locale is UTF-8's.
+    /// ASCII unless the user's locale is UTF-8.
     const Marks& marks() const;
     /// Readable when a key may be waiting.
     int inputDescriptor() const;
 
-    /// To be called when the extent may have changed.
+    /// Call this when the extent may have changed.
     void adoptSize();
     void show(const Grid& grid);
-    /// What is really on the screen is unknown: the next `show` draws all of it.
+    /// The contents of the screen are unknown: the next `show` draws all of it.
     void repaint();
     /// The next key; nothing when none is waiting.
     std::optional<KeyEvent> read();
-    /// Whether nobody is at the other end any more.
+    /// Whether the other end of the terminal has gone.
     bool isHungUp() const;
-    /// Puts a text into the clipboard of the terminal that the user sits at (OSC 52).
+    /// Puts a text into the clipboard of the user's terminal (OSC 52).
     void copy(std::string_view text);
 
 private:

@@ -18,17 +18,18 @@
 namespace pallax::terminal {
 
 /// The terminal front end without a terminal: takes keys, draws to a grid. The application's
-/// controllers work through its toolkit.
+/// controllers use its toolkit.
 class FrontEnd {
 public:
-    /// What only the surroundings can do.
+    /// Operations that the front end delegates.
     struct Surroundings {
-        std::function<void()> needsDisplay; ///< ask for `draw` soon; called perhaps often
+        std::function<void()> needsDisplay; ///< requests a `draw` soon; may be called often
         std::function<void()> quit;
         std::function<void(const std::string&)> copy; ///< to the clipboard
-        std::function<void()> repaint;                ///< the terminal may show something else
+        std::function<void()> repaint;                ///< the terminal may show something else;
+                                                      ///< redraw all
         std::function<void()> startAfresh = [] {};
-        /// The offset of the status text's time: "+0200".
+        /// The offset of the time in the status text: "+0200".
         std::function<std::string()> zone = [] { return std::string(); };
     };
 
@@ -36,23 +37,23 @@ public:
 
     TerminalToolkit& toolkit() { return _toolkit; }
 
-    /// The terminal has this extent now.
+    /// Sets the terminal's extent.
     void resize(int columns, int rows) { _toolkit.setSize(columns, rows); }
     void handle(const KeyEvent& event);
     Grid draw();
 
-    /// What has just happened, in the status text's place until the next key.
+    /// Replaces the status text until the next key.
     void setMessage(std::string message);
-    /// A few words behind the status text, from now on.
+    /// Sets a few words after the status text.
     void setNote(std::string note);
 
-    /// What the values come from.
+    /// Sets the origin of the values.
     void setOrigin(Origin origin);
-    /// A restarted link has left the values behind, which are from before `time` ("22:13:30"); with
-    /// an empty text, they follow the modem.
+    /// After a restart of the link: the values are from before `time` ("22:13:30"); if empty, they
+    /// are current.
     void setOldValues(std::string time);
 
-    /// Whether something on the screen turns, so that `turn` is to be called now and then.
+    /// Whether something on the screen is animated, so `turn` must be called regularly.
     bool isAnimated() const;
     void turn();
 
@@ -71,9 +72,9 @@ private:
     void save();
     void copyValue(TerminalTable& table);
     void startFilter(TerminalTable& table);
-    /// The typing of a filter ends with another pane on top, by a click or because its own is gone.
+    /// Stops typing a filter if another pane is on top, after a click or because its own is gone.
     void endFilterOfOtherPane();
-    /// The topmost pane's table; null while nothing is shown.
+    /// The topmost pane's table; null if none is shown.
     TerminalTable* table() const;
 
     Surroundings _surroundings;
@@ -83,7 +84,7 @@ private:
     ModalFocus _modalFocus = ModalFocus::Save;
     HelpPage _help;
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
-    std::weak_ptr<ui::TableScreen> _filteredPane; ///< whose it is
+    std::weak_ptr<ui::TableScreen> _filteredPane; ///< the pane of the filter
     std::optional<std::string> _message;
     std::string _note;
     Origin _origin;

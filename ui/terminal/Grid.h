@@ -7,12 +7,12 @@
 
 namespace pallax::terminal {
 
-/// How a text stands out. A terminal shows each as well as it can.
+/// The emphasis of a text. A terminal shows it as well as it can.
 struct Style {
     bool bold = false;
     bool dim = false;
     bool underline = false;
-    bool accent = false; ///< the one accent colour: where the user is
+    bool accent = false; ///< the one accent colour, for the current row
     bool operator==(const Style&) const = default;
 };
 
@@ -28,7 +28,7 @@ struct Position {
     bool operator==(const Position&) const = default;
 };
 
-/// A screen in memory: what is drawn on it can be shown by a terminal, or compared as text.
+/// A screen in memory: a terminal can show it, and tests compare it as text.
 class Grid {
 public:
     struct Cell {
@@ -42,12 +42,12 @@ public:
 
     int columns() const { return _columns; }
     int rows() const { return _rows; }
-    /// Inside the grid only.
+    /// Only for cells inside the grid.
     const Cell& at(int x, int y) const { return _cells[index(x, y)]; }
 
-    /// Writes `text` from column `x` (which may lie outside) of row `y`; what lies outside `clip`
-    /// or the grid is cut off, and half of a wide character becomes a blank. Returns the column
-    /// behind the text, cut or not.
+    /// Writes `text` from column `x` (which may be outside) of row `y`. Cuts off parts outside
+    /// `clip` or the grid; half of a wide character becomes a blank. Returns the column after the
+    /// whole text.
     int put(int x, int y, std::string_view text, Style style, Span clip);
     int put(int x, int y, std::string_view text, Style style = {}) {
         return put(x, y, text, style, {0, _columns});
@@ -57,13 +57,13 @@ public:
     /// Repeats a text of one column.
     void fill(Span span, int y, std::string_view text, Style style = {});
 
-    /// Where the terminal's cursor is seen; nowhere at first.
+    /// The position of the visible cursor; none at first.
     const std::optional<Position>& cursor() const { return _cursor; }
     void setCursor(Position position) { _cursor = position; }
 
-    /// The rows as text, without the blanks at their ends.
+    /// The rows as text, without trailing blanks.
     std::vector<std::string> lines() const;
-    /// The same in one piece, each row with its line end.
+    /// The rows as one text, each with a line end.
     std::string text() const;
 
 private:

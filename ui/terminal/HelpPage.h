@@ -6,12 +6,12 @@
 
 namespace pallax::terminal {
 
-/// The help page while it is open, and which part of it is seen.
+/// The open help page and its scroll position.
 class HelpPage {
 public:
     bool isOpen() const { return _isOpen; }
     void open();
-    /// Scrolls where the page does not fit; any key that does not scroll closes it.
+    /// Scrolls if the page does not fit; any other key closes the page.
     void handle(const KeyEvent& event);
     void draw(Grid& grid, const Marks& marks);
 
@@ -20,8 +20,8 @@ private:
 
     bool _isOpen = false;
     int _first = 0;
-    int _rows = 0;  ///< that fitted at the last drawing
-    int _lines = 0; ///< that there were then
+    int _rows = 0;  ///< rows that fit when last drawn
+    int _lines = 0; ///< lines when last drawn
 };
 
 } // namespace pallax::terminal

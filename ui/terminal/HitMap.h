@@ -6,17 +6,17 @@
 
 namespace pallax::terminal {
 
-/// What a click does, by where it lands; made anew with every drawing.
+/// The actions of clicks, by position; filled again with every drawing.
 class HitMap {
 public:
     using Action = std::function<void()>;
 
     void clear() { _areas.clear(); }
-    /// A later area lies over an earlier one.
+    /// Later areas are above earlier ones.
     void add(int x, int y, int columns, int rows, Action action) {
         _areas.push_back({x, y, columns, rows, std::move(action)});
     }
-    /// The action at a place, or an empty one.
+    /// The action at a position; empty if there is none.
     Action at(int x, int y) const {
         for (auto area = _areas.rbegin(); area != _areas.rend(); ++area) {
             if (x >= area->x && x < area->x + area->columns && y >= area->y &&

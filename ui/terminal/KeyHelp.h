@@ -7,7 +7,7 @@ namespace pallax::terminal {
 
 /// Keys and what they do, as the help page and the manual list them.
 struct KeyHelp {
-    std::string_view keys; ///< alternatives, each behind a blank
+    std::string_view keys; ///< alternatives, separated by blanks
     std::string_view meaning;
 };
 

@@ -23,10 +23,10 @@ enum class Key {
     WheelDown,
 };
 
-/// What the user did: a key, or something with the mouse.
+/// A user event: a key or a mouse action.
 struct KeyEvent {
     Key key = Key::Character;
-    char32_t character = 0; ///< of Key::Character; below U+0020 with the control key
+    char32_t character = 0; ///< for Key::Character; below U+0020 with the control key
     int x = 0;              ///< the column of a mouse event
     int y = 0;              ///< its row
 };

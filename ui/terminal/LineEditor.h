@@ -8,21 +8,21 @@
 
 namespace pallax::terminal {
 
-/// A line of UTF-8 text that is edited, with the cursor between two characters; a character and
-/// the combining ones behind it are moved over and deleted as one.
+/// An editor for one line of UTF-8 text, with a cursor between characters. A character and the
+/// combining characters after it are moved over and deleted as one.
 class LineEditor {
 public:
-    /// Longer texts are not taken: what is typed beyond is dropped.
+    /// Text typed beyond this length is ignored.
     static constexpr std::size_t kMaximumBytes = 4096;
 
     const std::string& text() const { return _text; }
-    /// The cursor's place, as an offset in bytes.
+    /// The cursor's offset in bytes.
     std::size_t cursor() const { return _cursor; }
-    /// Replaces the text; the cursor stands behind it.
+    /// Replaces the text and moves the cursor to its end.
     void setText(std::string text);
 
-    /// Takes an editing key; false when it is none. Besides the arrows, Home, End, Backspace and
-    /// Delete these are Ctrl-A, -E, -B, -F, -D, -H, -K, -U and -W, as in a shell.
+    /// Handles an editing key; false for other keys. Besides the arrows, Home, End, Backspace and
+    /// Delete, these are Ctrl-A, -E, -B, -F, -D, -H, -K, -U and -W, as in a shell.
     bool handle(const KeyEvent& event);
 
 private:
@@ -31,7 +31,7 @@ private:
     void erase(std::size_t from, std::size_t to);
     std::size_t before() const;
     std::size_t after() const;
-    /// The first boundary between characters at or behind `offset`.
+    /// The first boundary between characters at or after `offset`.
     std::size_t boundaryFrom(std::size_t offset) const;
     std::size_t wordStart() const;
 

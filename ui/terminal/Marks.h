@@ -5,16 +5,16 @@
 
 namespace pallax::terminal {
 
-/// The marks that are drawn beside texts, each one column wide, and what joins them.
+/// The marks drawn next to texts and between them, each one column wide.
 struct Marks {
     bool asciiOnly;
-    std::string_view cursor;     ///< before the row where the user is
-    std::string_view disclosure; ///< behind a row that opens
-    std::string_view changed;    ///< behind a value that the last tick changed
-    std::string_view more;       ///< where a text goes on beyond the edge
+    std::string_view cursor;     ///< before the current row
+    std::string_view disclosure; ///< after a row that opens
+    std::string_view changed;    ///< after a value that changed since the last tick
+    std::string_view more;       ///< where a text continues beyond the edge
     std::string_view up;         ///< before the number of rows above the window
-    std::string_view down;       ///< before that of the rows below it
-    std::string_view crumb;      ///< between the panes of the way here
+    std::string_view down;       ///< before the number of rows below the window
+    std::string_view crumb;      ///< between the panes of a path
     std::string_view dot;        ///< between technology and source
     std::string_view check;
     std::string_view horizontal;

@@ -6,10 +6,10 @@
 
 namespace pallax::terminal {
 
-/// Which part of a modal screen has the keys, while its text field is not edited.
+/// The part of a modal screen that receives keys while its text field is not edited.
 enum class ModalFocus { Save, Cancel };
 
-/// Draws the modal screen over what is there: the list, the text field, and the two buttons.
+/// Draws the modal screen over the pane: the list, the text field, and the two buttons.
 class ModalView {
 public:
     ModalView(Grid& grid, const Marks& marks, HitMap& hits)

@@ -8,22 +8,22 @@
 
 namespace pallax::terminal {
 
-/// A box with the alert's title, message and its one button. Drawn over all else.
+/// Draws a box with the alert's title, message and button over everything else.
 void drawAlert(Grid& grid, const Marks& marks, const ui::Alert& alert);
 
-/// The help page's lines in so many columns of screen: every key and what it does, side by side or,
-/// where that does not fit, the meaning below its keys.
+/// The lines of the help page for a screen of this width: each key with its meaning next to it, or
+/// below it if that does not fit.
 std::vector<std::string> helpLines(int columns);
 
-/// The help page from line `first` on, or from the last line at which it fills its box; how many
-/// lines it shows at once is returned.
+/// Draws the help page from line `first`, or from the last line at which it fills its box. Returns
+/// how many lines fit at once.
 int drawHelp(Grid& grid, const Marks& marks, int first);
 
-/// The least extent in which the screens can be drawn.
+/// The smallest extent in which the screens can be drawn.
 inline constexpr int kLeastColumns = 20;
 inline constexpr int kLeastRows = 5;
 
-/// Says which extent is needed, cut to what there is.
+/// Shows the required extent, cut to the grid.
 void drawTooSmall(Grid& grid);
 
 } // namespace pallax::terminal

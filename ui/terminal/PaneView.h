@@ -17,31 +17,30 @@ namespace pallax::terminal {
 
 class LineEditor;
 
-/// What is shown around a pane's rows beside the pane's own items.
+/// What is shown around a pane's rows besides the pane's own items.
 struct PaneStatus {
-    std::size_t spinnerTurn = 0;              ///< counts up while the spinner turns
+    std::size_t spinnerTurn = 0;              ///< increases while the spinner turns
     const LineEditor* filterEditor = nullptr; ///< while a filter is being typed
-    std::optional<std::string> message;       ///< in the status text's place
-    std::string note; ///< behind the status text, or in the rule above it where that is too long
-    Origin origin;    ///< in the title
-    std::string oldValues; ///< the time of values that are none of the modem's
-    std::string zone;      ///< of the status text's time
+    std::optional<std::string> message;       ///< replaces the status text
+    std::string note;      ///< after the status text, or in the rule above if it does not fit
+    Origin origin;         ///< in the title
+    std::string oldValues; ///< the time of values that are no longer updated
+    std::string zone;      ///< for the time in the status text
     std::function<void(const KeyEvent&)> press = [](const KeyEvent&) {}; ///< by a click
 };
 
-/// Whether the toolbar's activity indicator turns.
+/// Whether the toolbar's activity indicator is animated.
 bool isLoading(const ui::BarItems& items);
 /// The toolbar's save button, or null.
 const ui::SaveButton* saveButtonOf(const ui::BarItems& items);
 
-/// Draws the topmost pane: the way to it, its rows, and the toolbar.
+/// Draws the topmost pane: its path, its rows, and the toolbar.
 class PaneView {
 public:
     PaneView(Grid& grid, const Marks& marks, HitMap& hits)
         : _grid(grid), _marks(marks), _hits(hits) {}
 
-    /// Also tells the pane's table how much room it has. What can be clicked refers to the
-    /// navigation.
+    /// Also sets the size of the pane's table. Click actions refer to the navigation.
     void draw(TerminalNavigation& navigation, const PaneStatus& status);
 
 private:

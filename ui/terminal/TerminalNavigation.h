@@ -7,8 +7,8 @@
 
 namespace pallax::terminal {
 
-/// The panes that lie on top of each other, and the modal screen over them. It tells the screens
-/// when they come and go; a terminal has no use for animation.
+/// The stack of panes, and the modal screen above it. It tells the screens when they appear and
+/// disappear; animation is ignored.
 class TerminalNavigation final : public ui::NavigationStack {
 public:
     TerminalNavigation(std::shared_ptr<ui::TableScreen> root, std::function<void()> needsDisplay);
@@ -23,7 +23,7 @@ public:
     void presentModal(std::shared_ptr<ui::ModalScreen> screen, bool animated) override;
     void dismissModal(bool animated) override;
 
-    /// The root is about to be seen for the first time.
+    /// The root is about to appear for the first time.
     void appear();
     ui::TableScreen& top() const { return *_screens.back(); }
     bool isAtRoot() const { return _screens.size() == 1; }

@@ -4,27 +4,27 @@
 
 namespace pallax::terminal {
 
-/// Restores the terminal when the process dies of a signal (a crash, an abort, Ctrl-\), and then
-/// lets it die of it. One at a time; the destructor gives the signals their default actions.
+/// Restores the terminal when a signal kills the process (a crash, an abort, Ctrl-\), and then lets
+/// it die. One at a time; the destructor resets the signals to their default actions.
 class TerminalRestorer {
 public:
-    /// `descriptor` is the terminal, as it was before anything was drawn.
+    /// `descriptor` is the terminal in its original state.
     explicit TerminalRestorer(int descriptor);
     ~TerminalRestorer();
     TerminalRestorer(const TerminalRestorer&) = delete;
     TerminalRestorer& operator=(const TerminalRestorer&) = delete;
 
-    /// What is written to the terminal; nothing at first.
+    /// The bytes to write to the terminal; none at first.
     void setSequence(std::string_view sequence);
 
-    /// From here on SIGINT, SIGTERM, SIGHUP and SIGQUIT restore the terminal and end the process
-    /// too, until others handle them.
+    /// From now on SIGINT, SIGTERM, SIGHUP and SIGQUIT also restore the terminal and end the
+    /// process, until others handle them.
     static void guardEndings();
 
-    /// Both are safe in a signal handler, and do nothing while there is no restorer. Lets output go
-    /// on that Ctrl-S, or a terminal that takes nothing, holds back; what waits there is dropped.
+    /// Both are safe in a signal handler, and do nothing without a restorer. Unblocks output that
+    /// Ctrl-S, or a terminal that accepts nothing, holds back; discards the output waiting there.
     static void release();
-    /// Restores the terminal, also one that Ctrl-S has stopped.
+    /// Restores the terminal, even if Ctrl-S has stopped it.
     static void restore();
 };
 

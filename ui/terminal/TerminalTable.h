@@ -15,19 +15,19 @@ namespace pallax::terminal {
 /// rows, the filter and the cursor; the window follows the cursor.
 class TerminalTable final : public ui::TableView {
 public:
-    /// Called when something must be drawn anew.
+    /// Called when a redraw is needed.
     using NeedsDisplay = std::function<void()>;
 
     TerminalTable(ui::TableSource& source, ui::Rect contentBounds, NeedsDisplay needsDisplay);
 
-    /// Never gives one: a terminal shows so few rows that it makes a new cell for each.
+    /// Always null: a terminal shows so few rows that it creates a new cell for each.
     std::shared_ptr<ui::TableCell> dequeueReusableCell(std::string_view identifier) override;
     ui::Rect contentBounds() const override { return _contentBounds; }
     void reloadData() override;
     void deselectRow(std::size_t row, bool animated) override;
     void sizeToFit() override;
 
-    /// The room that there is now, in rows; and what a cell has, in points.
+    /// The available rows, and the area of a cell in points.
     void setViewport(std::size_t rows, ui::Rect contentBounds);
 
     /// The source's pane.
@@ -38,9 +38,9 @@ public:
     /// Moves the cursor by so many rows, stopping at the ends.
     void moveCursor(std::ptrdiff_t rows);
     void moveCursorTo(std::size_t shown);
-    /// Moves the window by so many rows, stopping at the ends; the cursor stays inside it.
+    /// Moves the window by this many rows, stopping at the ends; the cursor stays inside.
     void scroll(std::ptrdiff_t rows);
-    /// A window's height, less one row.
+    /// The height of the window less one row.
     std::ptrdiff_t page() const;
     void moveToEnd() { moveCursorTo(pane().shownRows()); }
 
@@ -49,7 +49,7 @@ public:
 
     /// How far the cursor's row is scrolled sideways, in columns.
     int sidewaysOffset() const { return _sidewaysOffset; }
-    /// Scrolls the cursor's row; false when it is at that end already (also one that fits).
+    /// Scrolls the cursor's row; false if it is already at that end, or fits.
     bool scrollSideways(int columns);
 
     ui::TableSource& source() { return _source; }
@@ -69,7 +69,7 @@ private:
     std::optional<std::string> _scrolledName; ///< of the row that is scrolled sideways
 };
 
-/// Every table of this front end's screens was made by its toolkit.
+/// Every table of this front end's screens comes from its toolkit.
 TerminalTable& terminalTable(ui::TableView& table);
 
 } // namespace pallax::terminal

@@ -7,7 +7,7 @@
 
 namespace pallax::terminal {
 
-/// A text field that is edited with the keyboard; while it is, it has the keys.
+/// A text field that receives the keys while it is edited.
 class TerminalTextField final : public ui::TextField {
 public:
     explicit TerminalTextField(std::function<void()> needsDisplay)
@@ -19,7 +19,7 @@ public:
 
     bool isEditing() const { return _isEditing; }
     void beginEditing();
-    /// A key while it is edited; false when the field has no use for it.
+    /// Handles a key during editing; false if the field does not use it.
     bool handle(const KeyEvent& event);
     const LineEditor& editor() const { return _editor; }
 
@@ -30,7 +30,7 @@ private:
     bool _isEditing = false;
 };
 
-/// Every text field of this front end's screens was made by its toolkit.
+/// Every text field of this front end's screens comes from its toolkit.
 TerminalTextField& terminalTextField(ui::TextField& field);
 
 } // namespace pallax::terminal

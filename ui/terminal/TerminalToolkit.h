@@ -11,10 +11,11 @@
 
 namespace pallax::terminal {
 
-/// The toolkit of a terminal: makes what the controllers ask for and keeps what is on the screen.
+/// The toolkit of a terminal: creates objects for the controllers and keeps the state of the
+/// screen.
 class TerminalToolkit final : public ui::Toolkit {
 public:
-    /// `needsDisplay` is called, perhaps often, when something must be drawn anew.
+    /// `needsDisplay` is called when a redraw is needed, possibly often.
     explicit TerminalToolkit(std::function<void()> needsDisplay)
         : _needsDisplay(std::move(needsDisplay)) {}
 
@@ -34,7 +35,7 @@ public:
     int columns() const { return _columns; }
     int rows() const { return _rows; }
 
-    /// The stack that the visible window shows; null while there is none.
+    /// The stack of the visible window; null if there is none.
     TerminalNavigation* navigation() const { return _visible; }
     /// The alert that is open, or null.
     const ui::Alert* alert() const { return _alerts.empty() ? nullptr : &_alerts.front(); }
@@ -49,10 +50,10 @@ private:
     int _columns = 80; // until the terminal's extent is known
     int _rows = 24;
     TerminalNavigation* _visible = nullptr;
-    std::deque<ui::Alert> _alerts; // the one in front is open
+    std::deque<ui::Alert> _alerts; // the front one is open
 };
 
-/// The content area of a table's rows in so many columns: two stay free for the mark behind it.
+/// The content area of a row for this width: two columns are left for the mark after it.
 ui::Rect rowContentBounds(int columns);
 
 } // namespace pallax::terminal

@@ -7,20 +7,21 @@
 
 namespace pallax::terminal {
 
-/// What stands in one place on a terminal: a character and the combining ones that follow it, or
-/// one character of the escape of what commands a terminal (platform/Printable).
+/// The content of one position on a terminal: a character and the combining characters after it, or
+/// one character of an escape (text/Printable).
 struct Cluster {
-    std::string text;       ///< UTF-8; what cannot be shown is replaced by U+FFFD
+    std::string text;       ///< UTF-8; unprintable input is replaced by U+FFFD
     int columns = 1;        ///< 1, or 2 for a wide character
-    std::size_t offset = 0; ///< of its first byte in the text
-    std::size_t bytes = 0;  ///< that it takes there; of an escape, those of what it stands for
+    std::size_t offset = 0; ///< offset of its first byte in the text
+    std::size_t bytes = 0;  ///< its bytes in the text; for an escape, those of the escaped
+                            ///< character
 };
 
-/// Splits a text into clusters. A byte that is no UTF-8 becomes U+FFFD; a combining character
-/// without one before it stands on a blank.
+/// Splits a text into clusters. A byte that is not UTF-8 becomes U+FFFD; a combining character
+/// without a base is put on a blank.
 std::vector<Cluster> clustersOf(std::string_view text);
 
-/// How many columns the text takes.
+/// The width of the text in columns.
 int columnsOf(std::string_view text);
 
 } // namespace pallax::terminal
