@@ -8,12 +8,12 @@ namespace pallax {
 
 class Clock;
 
-/// Writes moments in local time by a pattern: a run of the letters y, M, d, H, m or s is the year,
-/// month, day, hour (0 to 23), minute or second with at least as many digits as letters; what
-/// stands between apostrophes, and every other character, is itself.
+/// Formats times in local time by a pattern. A run of the letters y, M, d, H, m or s is the year,
+/// month, day, hour (0 to 23), minute or second, with at least as many digits as letters. Text
+/// between apostrophes and all other characters are copied.
 class DateFormatter {
 public:
-    /// `clock` knows the local time zone; it outlives the formatter.
+    /// `clock` knows the local time zone and must outlive the formatter.
     DateFormatter(std::string pattern, const Clock& clock);
 
     std::string stringFromDate(Time time) const;

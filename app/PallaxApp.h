@@ -21,37 +21,37 @@ class FileSystem;
 class MainQueue;
 class Preferences;
 
-/// The application object: builds window and panes, owns the model, turns its ticks into reloads,
-/// opens and closes the snapshot screen, and switches a home-screen preference off at exit.
+/// The application object: creates window and panes, owns the model, reloads the panes at its
+/// ticks, opens and closes the snapshot screen, and switches a home-screen preference off at exit.
 class PallaxApp final : public ModelObserver,
                         public PaneApplication,
                         public ui::NavigationDelegate {
 public:
     static constexpr std::string_view kSnapshotDirectory = "/var/mobile/Library/Logs/Faultbox";
-    /// Only where this path exists is the save button offered.
+    /// The save button is offered only if this path exists.
     static constexpr std::string_view kSaveButtonMarker =
         "/NorvaneInternal/Library/PreferenceBundles/Carrier Settings.bundle";
 
-    /// Makes the model, whose observer is the application object.
+    /// Creates the model, whose observer is the application object.
     using ModelMaker = std::function<std::unique_ptr<PallaxModel>(ModelObserver& observer)>;
 
-    /// Told what the modem speaks (nothing before it is known), and when the shown values came if a
-    /// restarted link has left them behind.
+    /// Receives the technology (empty until known) and, if a restarted link left old values on
+    /// display, their time.
     using LinkChanged =
         std::function<void(const std::string& technology, const std::optional<Time>& valuesFrom)>;
 
-    /// All that is referred to outlives the application object. The model's queue is this one.
+    /// All references must outlive the application object. The model must use the same queue.
     struct Surroundings {
         ui::Toolkit& toolkit;
         FileSystem& files;
         Preferences& preferences;
         MainQueue& queue;
-        const Clock& clock;   ///< of the display: a recording's while one is played
-        const Clock& present; ///< names files
+        const Clock& clock;   ///< for the display; in a recording, the recording's
+        const Clock& present; ///< for file names
         ModelMaker makeModel;
         std::string snapshotDirectory = std::string(kSnapshotDirectory);
         std::string saveButtonMarker = std::string(kSaveButtonMarker);
-        /// When a restarted link leaves the display with its old values.
+        /// Whether to start afresh after a restart of the link.
         bool startsAfreshByItself = false;
         LinkChanged linkChanged = {};
     };
@@ -62,16 +62,16 @@ public:
     PallaxApp(const PallaxApp&) = delete;
     PallaxApp& operator=(const PallaxApp&) = delete;
 
-    /// Shows the root pane and posts the model's first start to the queue.
+    /// Shows the root pane and posts the first start of the model to the queue.
     void applicationDidFinishLaunching();
-    /// Makes a new model in place of the old one, and shows the root pane as at the launch; a
-    /// snapshot screen that is open keeps what it holds. Not to be called by the model itself.
+    /// Replaces the model with a new one and shows the root pane as at launch; an open snapshot
+    /// screen keeps its contents. The model itself must not call this.
     void startAfresh();
-    /// To be called at every exit, once.
+    /// Must be called at every exit, once.
     void applicationWillTerminate();
 
     void getSaveButtonPref();
-    /// Stores whether the home screen shows the GSM signal strength, and tells it to read again.
+    /// Stores whether the home screen shows the GSM signal strength, and notifies it.
     void _setGSMRSSI(bool shown);
     /// Opens the snapshot screen unless it is open.
     void showSaveView() override;
@@ -80,7 +80,7 @@ public:
     /// Updates the displays that the snapshot screen saves, with every packet that has arrived.
     void bringUpToDate();
     void updateStatusForViewController(PallaxPaneController& pane);
-    /// Reloads every pane, or pops back to below the first whose path has vanished; then the
+    /// Reloads every pane, or pops to below the first whose path has vanished, then updates the
     /// status of the top pane.
     void updateViewControllerFromModel() override;
     void generatorChosen(const std::string& technology, bool keepsDisplay) override;
@@ -92,7 +92,7 @@ public:
     /// Null before the launch and after termination.
     ui::Window* window() const { return _window.get(); }
     void setWindow(std::unique_ptr<ui::Window> window) { _window = std::move(window); }
-    /// The snapshot screen while it is shown, else null.
+    /// The snapshot screen while it is shown, otherwise null.
     const std::shared_ptr<PallaxSaveViewController>& saveViewController() const {
         return _saveViewController;
     }
@@ -112,7 +112,7 @@ private:
     NodeRef nodeOf(const PallaxPaneController& pane, std::size_t index);
     void reloadPanes();
     void updateTopStatus();
-    /// A block for the queue that does nothing once the application object is gone.
+    /// A block for the queue that does nothing after the application object is destroyed.
     std::function<void()> whileAlive(void (PallaxApp::*action)());
     void restartMonitor();
     void postRestart();
@@ -120,7 +120,7 @@ private:
 
     Surroundings _surroundings;
     std::unique_ptr<ui::NavigationStack> _navController;
-    std::unique_ptr<ui::Window> _window; // goes before the stack
+    std::unique_ptr<ui::Window> _window; // destroyed before the stack
     std::unique_ptr<PallaxModel> _model;
     std::shared_ptr<PallaxSaveViewController> _saveViewController;
     std::unique_ptr<DateFormatter> _dateFormatter;

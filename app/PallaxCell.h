@@ -12,12 +12,12 @@ namespace ui {
 class TextMetrics;
 }
 
-/// A row of a pane. Two kinds share one reuse identifier, so a cell may have to show a node of
-/// the other kind: a branch cell has no place for a value, and a leaf cell that shows a branch
-/// keeps its scroll container as it was last laid out.
+/// A row of a pane. Both kinds share one reuse identifier, so a cell may have to show a node of the
+/// other kind: a branch cell has no value label, and a leaf cell that shows a branch keeps the last
+/// layout of its scroll container.
 class PallaxCell final : public ui::TableCell {
 public:
-    /// What a cell was made for.
+    /// What a cell was created for.
     enum class Kind {
         /// The key label directly in the content area.
         Branch,
@@ -25,7 +25,7 @@ public:
         Leaf,
     };
 
-    /// `metrics` outlives the cell.
+    /// `metrics` must outlive the cell.
     PallaxCell(Kind kind, std::string reuseIdentifier, const ui::TextMetrics& metrics);
 
     const std::shared_ptr<ui::Label>& key() const { return _key; }
@@ -33,20 +33,20 @@ public:
     /// Null in a branch cell.
     const std::shared_ptr<ui::Label>& value() const { return _value; }
     void setValue(std::shared_ptr<ui::Label> value) { _value = std::move(value); }
-    /// The container that holds both labels, whose frames are places in its content; null in a
-    /// branch cell.
+    /// The container of both labels, whose frames are relative to its content; null in a branch
+    /// cell.
     const std::shared_ptr<ui::ScrollContainer>& view() const { return _view; }
 
-    /// The labels that it has; with a container, their places are in its content.
+    /// The cell's labels; in a container, their frames are relative to its content.
     ui::CellContents contents() const override;
 
-    /// Lays out a branch row: the key alone, whatever else the cell has.
+    /// Lays out a branch row: only the key, even if the cell has more.
     void setLayoutKey();
-    /// Lays out a leaf row: the value flush right, or behind the key in a row that scrolls.
+    /// Lays out a leaf row: the value is flush right, or follows the key in a row that scrolls.
     void setLayout();
 
 private:
-    /// The extent of a label's text; none for no label.
+    /// The extent of a label's text; zero if there is no label.
     ui::Size measured(const std::shared_ptr<ui::Label>& label) const;
     void placeKey(const ui::Size& extent);
 

@@ -15,14 +15,14 @@ class NavigationStack;
 class Toolkit;
 } // namespace ui
 
-/// What a pane asks of the application object.
+/// The application object as panes use it.
 class PaneApplication {
 public:
     virtual ~PaneApplication() = default;
     /// Whether panes offer the save button.
     virtual bool allowSaveButton() const = 0;
     virtual void showSaveView() = 0;
-    /// The stack that panes lie on; null as long as there is none.
+    /// The panes' stack; null until it exists.
     virtual ui::NavigationStack* navigationController() = 0;
 };
 
@@ -31,17 +31,17 @@ public:
 /// roles with what the pane's model says.
 class PallaxPaneController final : public ui::TableScreen, public PaneOwner {
 public:
-    /// `node` may be null: no data yet. Toolkit and application outlive the pane.
+    /// `node` may be null: no data yet. Toolkit and application must outlive the pane.
     PallaxPaneController(ui::Toolkit& toolkit, PaneApplication& application, NodeRef node,
                          std::string path);
 
-    /// Rebuilds the toolbar: spinner, status, space and, where it is allowed, the save button.
+    /// Rebuilds the toolbar: spinner, status, space and, if allowed, the save button.
     void createToolbarItems();
     void viewWillAppear(bool animated) override;
-    /// Gives up first-responder status and leaves the toolkit's own handling out.
+    /// Resigns first-responder status without the toolkit's own handling.
     void viewWillDisappear(bool animated) override;
 
-    /// No status counts as an empty one.
+    /// A missing status is shown as empty.
     void setStatus(std::optional<std::string> status, bool isLoading);
     /// As PaneModel::show, whose cursor and filter hold for the new rows.
     void reloadWithNode(NodeRef node, std::optional<Time> time = {});

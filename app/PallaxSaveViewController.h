@@ -22,35 +22,34 @@ class MainQueue;
 /// property-list file. Its items and its time stamp are those of its creation.
 class PallaxSaveViewController final : public ui::ModalScreen, public PaneOwner {
 public:
-    /// All that is referred to outlives the screen.
+    /// All references must outlive the screen.
     struct Surroundings {
         ui::Toolkit& toolkit;
         FileSystem& files;
-        const Clock& clock;   ///< of the display: stamps the screen
-        const Clock& present; ///< names the file
+        const Clock& clock;   ///< for the time stamp
+        const Clock& present; ///< for the file name
         MainQueue& queue;
         std::string snapshotDirectory;
-        /// The application's; posted to the queue, where it may run after the screen's end.
+        /// The application's; posted to the queue, where it may run after the screen is destroyed.
         std::function<void()> closeSaveView;
         /// Updates the displays that are saved, whose sections are the live ones, with every packet
         /// that has arrived.
         std::function<void()> bringUpToDate;
     };
 
-    /// `saveHistory` is an array, or null when there are no save contents.
+    /// `saveHistory` is an array, or null without save contents.
     PallaxSaveViewController(Surroundings surroundings, const PropertyList& saveHistory);
 
-    /// A snapshot file's root dictionary; it ends at the first value that is null.
+    /// The root dictionary of a snapshot file; it ends at the first null value.
     static Dictionary snapshot(const PropertyList& timestamp, const PropertyList& data,
                                const PropertyList& description);
 
     void viewDidLoad() override;
-    /// Takes the application's area of the screen and leaves the toolkit's own handling out.
+    /// Takes the application's area of the screen, without the toolkit's own handling.
     void viewWillAppear(bool animated) override;
 
-    /// Writes the file; for a character that it cannot hold stands U+FFFD, which is logged. Whether
-    /// that succeeds or not, the screen is closed afterwards; a failure is logged and shown as an
-    /// alert.
+    /// Writes the file. A character that the file cannot hold is replaced by U+FFFD and logged.
+    /// Closes the screen in any case; a failure is logged and shown as an alert.
     void savePressed() override;
     void cancelPressed() override;
     void backgroundTouched() override;

@@ -6,7 +6,7 @@
 
 namespace pallax {
 
-/// Tells a display that follows the modem from one that a restarted link has left with its values.
+/// Tells whether the display is current, or a restarted link has left it with old values.
 class DisplayAge {
 public:
     /// New data was shown.
@@ -15,7 +15,7 @@ public:
             _lastShown = now;
         }
     }
-    /// As ModelObserver is told it.
+    /// As told to ModelObserver.
     void generatorChosen(bool keepsDisplay, Time now) {
         if (!keepsDisplay) {
             _left.reset();
@@ -23,11 +23,11 @@ public:
             _left = _lastShown.value_or(now);
         }
     }
-    /// When the values that are shown came, if none of them follows the modem any more.
+    /// If the values on display are no longer updated: the time of the last update.
     const std::optional<Time>& left() const { return _left; }
 
 private:
-    std::optional<Time> _lastShown; ///< while the values followed the modem
+    std::optional<Time> _lastShown; ///< while the display was current
     std::optional<Time> _left;
 };
 

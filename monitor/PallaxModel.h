@@ -19,8 +19,8 @@ public:
     virtual ~ModelObserver() = default;
     /// New data has arrived since the last display tick; called on the main queue.
     virtual void updateViewControllerFromModel() = 0;
-    /// A generator for what the modem speaks is in place. `keepsDisplay`: after a restart of the
-    /// link the display keeps its values, whatever arrives from now on.
+    /// A generator for the modem's technology is in place. `keepsDisplay`: after a restart of the
+    /// link, the display keeps its old values, and new data does not change it.
     virtual void generatorChosen(const std::string& /*technology*/, bool /*keepsDisplay*/) {}
 };
 
@@ -52,10 +52,10 @@ public:
     /// Looks after the link, and after new data drops the tree and tells the observer.
     void refresh() { _link.refresh(); }
 
-    /// The root of the display tree; null while there is no generator. The caller may keep it
-    /// beyond the next refresh.
+    /// The root of the display tree; null without a generator. The caller may keep it after the
+    /// next refresh.
     NodeRef topLevelNodes();
-    /// The node that stands at `path` ("/", "/Serving Cell"), or null.
+    /// The node at `path` ("/", "/Serving Cell"), or null.
     NodeRef nodeAtPath(std::string_view path);
     /// The generator's save contents (an array), or null without a generator. The sections of their
     /// displays are the live ones, which are up to date after a call of `display`.

@@ -6,7 +6,8 @@
 
 namespace pallax {
 
-/// The current time and the local time zone. While a recording is played, the recording's.
+/// The current time and the local time zone. For a recording that is being played, the recording's
+/// time.
 class Clock {
 public:
     struct Zone {

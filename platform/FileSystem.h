@@ -6,12 +6,12 @@
 
 namespace pallax {
 
-/// What the application needs of the file system.
+/// The file-system operations of the application.
 class FileSystem {
 public:
     virtual ~FileSystem() = default;
     virtual bool exists(const std::string& path) const = 0;
-    /// Writes an XML property list, straight to the path; false when that failed.
+    /// Writes an XML property list directly to the path; false on failure.
     virtual bool writePropertyList(const std::string& path, const PropertyList& object) = 0;
 };
 

@@ -6,7 +6,7 @@
 namespace pallax {
 
 /// The main dispatch queue. Blocks run one at a time, on the main thread, in the order in which
-/// they were posted or fell due. An exception leaves through whoever runs the queue.
+/// they were posted or fell due. Exceptions propagate to the caller that runs the queue.
 class MainQueue {
 public:
     using Block = std::function<void()>;

@@ -12,9 +12,9 @@ public:
     virtual ~Preferences() = default;
     virtual void setValue(std::string_view key, const PropertyList& value,
                           std::string_view domain) = 0;
-    /// Makes the domain's values durable; false when that failed.
+    /// Writes the domain's values to permanent storage; false on failure.
     virtual bool synchronize(std::string_view domain) = 0;
-    /// Tells whoever listens that the key has changed.
+    /// Notifies listeners that the key has changed.
     virtual void postChangedNotice(std::string_view domain, std::string_view key) = 0;
 };
 

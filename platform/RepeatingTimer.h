@@ -6,8 +6,7 @@
 
 namespace pallax {
 
-/// A scheduled repeating timer. It ends with `invalidate` or with its destruction; either may
-/// happen inside its own action.
+/// A scheduled repeating timer. `invalidate` or destruction ends it, even inside its own action.
 class RepeatingTimer {
 public:
     virtual ~RepeatingTimer() = default;

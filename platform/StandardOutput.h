@@ -4,7 +4,7 @@
 
 namespace pallax {
 
-/// The process's standard output, on which a few destruction notices are printed.
+/// The process's standard output, for a few destruction notices.
 class StandardOutput {
 public:
     virtual ~StandardOutput() = default;

@@ -12,12 +12,12 @@ enum class LogPriority : int {
     Warning = 4,
     Notice = 5,
     Informational = 6,
-    /// The raw value that the DLF writer logs its failures with; its level (its low three bits)
-    /// is 0, the most urgent one.
+    /// The raw value of the DLF writer's failures; its level (its low three bits) is 0, the most
+    /// urgent.
     DlfFailure = 16,
 };
 
-/// Where log lines go.
+/// The destination of log lines.
 class LogSink {
 public:
     virtual ~LogSink() = default;
@@ -29,11 +29,11 @@ class SystemLog {
 public:
     static constexpr int kEverything = 7;
 
-    /// Lines whose level is above `threshold` (0 to 7) are dropped before their text is made.
-    /// `sink` may be null; it must outlive its use. Not for use from several threads at once.
+    /// Lines with a level above `threshold` (0 to 7) are dropped before they are formatted. `sink`
+    /// may be null and must outlive its use. Not thread-safe.
     static void setSink(LogSink* sink, int threshold = kEverything);
 
-    /// How urgent a priority is, from 0 (most) to 7.
+    /// The urgency of a priority, from 0 (most urgent) to 7.
     static constexpr int levelOf(LogPriority priority) {
         constexpr unsigned kLevelBits = 7;
         return static_cast<int>(static_cast<unsigned>(priority) & kLevelBits);
@@ -43,7 +43,7 @@ public:
 
 private:
     static LogSink* _sink;
-    static int _threshold; // -1 while there is no sink
+    static int _threshold; // -1 without a sink
 };
 
 /// Logs a line. `format` is printf's, with %@ for objects; see `formatText`.

@@ -2,8 +2,8 @@
 
 #include <string_view>
 
-/// The telephony service's constants: what it calls technologies and the keys and values of a
-/// cell-monitor dictionary.
+/// The telephony service's constants: names of technologies, keys and values of a cell-monitor
+/// dictionary.
 namespace pallax {
 
 inline constexpr std::string_view kHXLogChannelTechnology_IFX = "IFX";
@@ -12,7 +12,7 @@ inline constexpr std::string_view kHXLogChannelTechnology_Zorell_CDMA = "Zorell_
 inline constexpr std::string_view kHXLogChannelTechnology_Zorell_LTE = "Zorell_LTE";
 inline constexpr std::string_view kHXLogChannelTechnology_Zorell_UTRAN2 = "Zorell_UTRAN2";
 
-// The string of every cell-monitor constant is its own name.
+// The string of each cell-monitor constant is its own name.
 inline constexpr std::string_view kHXCellMonitorCellRadioAccessTechnology =
     "kHXCellMonitorCellRadioAccessTechnology";
 inline constexpr std::string_view kHXCellMonitorRadioAccessTechnologyGSM =

@@ -18,8 +18,8 @@ namespace pallax {
 class PallaxModelNode;
 using NodeRef = std::shared_ptr<const PallaxModelNode>;
 
-/// Path ("/Serving Cell/ARFCN") to node. Its entries lie in a few big blocks, which are freed as a
-/// whole: allocated one by one they made a third of a tick of 50,000 leaves (bench/ScreenBench).
+/// Maps paths ("/Serving Cell/ARFCN") to nodes. Its entries are in a few large blocks, freed
+/// together: individual allocations took a third of a tick of 50,000 leaves (bench/ScreenBench).
 class PathDictionary {
     using Nodes = std::pmr::unordered_map<std::string, NodeRef>;
 
@@ -29,14 +29,14 @@ public:
     PathDictionary(const PathDictionary&) = delete;
     PathDictionary& operator=(const PathDictionary&) = delete;
 
-    /// Room for so many entries at once.
+    /// Reserves room for this many entries.
     void reserve(std::size_t count) { _nodes.reserve(count); }
     void insert_or_assign(std::string path, NodeRef node) {
         _nodes.insert_or_assign(std::move(path), std::move(node));
     }
     void clear() { _nodes.clear(); }
 
-    /// The node under a path; throws std::out_of_range where there is none.
+    /// The node at a path; throws std::out_of_range if there is none.
     const NodeRef& at(const std::string& path) const { return _nodes.at(path); }
     Nodes::const_iterator find(const std::string& path) const { return _nodes.find(path); }
     bool contains(const std::string& path) const { return _nodes.contains(path); }
@@ -54,11 +54,11 @@ private:
     Nodes _nodes{&_storage};
 };
 
-/// A named node of the display tree; created once, never changed. Whether it is a branch is told
-/// by `childNodes` being non-null, never by its class.
+/// A named node of the display tree; immutable. A node is a branch if `childNodes` is not null,
+/// whatever its class.
 class PallaxModelNode {
 public:
-    /// A name that others may hold too: mostly the key in the display. Never null.
+    /// A name that may be shared, usually with the key in the display. Never null.
     using SharedName = std::shared_ptr<const std::string>;
 
     explicit PallaxModelNode(SharedName name) : _name(std::move(name)) {}
@@ -71,16 +71,16 @@ public:
     const std::string& displayName() const { return *_name; }
     /// The children in display order; null for a leaf. Valid as long as the node.
     virtual const std::vector<NodeRef>* childNodes() const { return nullptr; }
-    /// The value of a leaf: a string or display number (which knows its number and unit); null
-    /// for a branch. Valid as long as the node.
+    /// The value of a leaf: a string or display number (which knows its number and unit); null for
+    /// a branch. Valid as long as the node.
     virtual const PropertyList* value() const { return nullptr; }
     /// When a packet last gave the value of a leaf, the same one as before or another. Nothing for
     /// a branch, and where the display does not keep it.
     virtual std::optional<Time> readAt() const { return std::nullopt; }
 
-    /// Builds the tree of a display object; its root is named "Pallax" and has the path "/".
-    /// Fills `pathDictionary` (empty before) with every node; of two nodes with one path it keeps
-    /// the later. A null object has no tree: null is returned and nothing is stored.
+    /// Builds the tree of a display object; its root is named "Pallax" and has the path "/". Fills
+    /// `pathDictionary` (empty before) with every node; of two nodes with the same path it keeps
+    /// the later. For a null object it returns null and stores nothing.
     static NodeRef makeTreeFromObject(const PropertyList& object, PathDictionary& pathDictionary);
 
 private:
@@ -100,7 +100,7 @@ private:
     PropertyList _string;
 };
 
-/// A row that opens a further pane; an empty one is a branch too.
+/// A row that opens another pane; an empty one is also a branch.
 class PallaxModelTreeNode final : public PallaxModelNode {
 public:
     PallaxModelTreeNode(SharedName name, std::vector<NodeRef> children)
@@ -113,10 +113,10 @@ private:
     std::vector<NodeRef> _childNodes;
 };
 
-/// The path of the child `name` below `parent`, joined by exactly one slash: "/" + "A" is "/A",
-/// "/A" + "B" and "/A" + "/B" are "/A/B".
+/// The path of the child `name` of `parent`, joined by exactly one slash: "/" + "A" is "/A", "/A" +
+/// "B" and "/A" + "/B" are "/A/B".
 std::string childPath(std::string_view parent, std::string_view name);
-/// The same in place of the parent's path.
+/// The same, replacing the parent's path.
 void makeChildPath(std::string& path, std::string_view name);
 
 } // namespace pallax

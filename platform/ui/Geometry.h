@@ -2,7 +2,7 @@
 
 namespace pallax::ui {
 
-/// Places and extents on the screen, in points: y grows downwards. A front end with other units
+/// Positions and sizes on the screen, in points; y grows downwards. A front end with other units
 /// scales.
 struct Point {
     double x = 0;

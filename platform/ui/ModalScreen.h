@@ -9,8 +9,8 @@
 
 namespace pallax::ui {
 
-/// A screen over all others, laid out by the front end: a list, a text field, a control that
-/// saves, one that cancels, and a background that can be touched.
+/// A screen over all others, laid out by the front end: a list, a text field, a save control, a
+/// cancel control, and a background that can be touched.
 class ModalScreen : public Screen, public TableSource, public TextFieldDelegate {
 public:
     ModalScreen(Toolkit& toolkit, std::string_view layoutName)

@@ -8,7 +8,7 @@
 
 namespace pallax::ui {
 
-/// A screen that is one table, of which it is the source.
+/// A screen that is one table and its source.
 class TableScreen : public Screen, public TableSource {
 public:
     explicit TableScreen(Toolkit& toolkit)

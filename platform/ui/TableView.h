@@ -20,14 +20,14 @@ enum class CellStyle {
 
 enum class CellAccessory { None, DisclosureIndicator, Checkmark };
 
-/// What a cell has to draw in its content area. The labels' frames count from the content area,
-/// or, where there is a scroll container, from the start of its content.
+/// What a cell draws in its content area. The labels' frames are relative to the content area or,
+/// with a scroll container, to its content.
 struct CellContents {
     std::vector<const Label*> labels;
     const ScrollContainer* container = nullptr;
 };
 
-/// A row as it is shown. A class of its own may add labels and lay them out.
+/// A row as it is shown. Derived classes may add labels and lay them out.
 class TableCell {
 public:
     TableCell(CellStyle style, std::string reuseIdentifier)
@@ -54,7 +54,7 @@ public:
     /// Valid as long as the cell.
     virtual CellContents contents() const { return {{&_textLabel}, nullptr}; }
 
-    /// The toolkit's own layout: its label fills the content area.
+    /// The toolkit's default layout: the label fills the content area.
     virtual void layoutSubviews() { _textLabel.frame = _contentBounds; }
 
 private:

@@ -9,11 +9,11 @@ class TextField;
 class TextFieldDelegate {
 public:
     virtual ~TextFieldDelegate() = default;
-    /// The return key was pressed; true lets the field do what it does by itself.
+    /// The return key was pressed; true allows the field's default action.
     virtual bool textFieldShouldReturn(TextField& field) = 0;
 };
 
-/// A line of text that is edited.
+/// An editable line of text.
 class TextField {
 public:
     virtual ~TextField() = default;

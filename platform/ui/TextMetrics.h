@@ -14,7 +14,7 @@ struct Font {
     bool operator==(const Font&) const = default;
 };
 
-/// How much room a text takes.
+/// Measures texts.
 class TextMetrics {
 public:
     virtual ~TextMetrics() = default;

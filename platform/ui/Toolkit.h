@@ -17,7 +17,7 @@ class TableView;
 class TextField;
 class Window;
 
-/// What a modal screen's layout is made of.
+/// The parts of a modal screen's layout.
 struct ModalOutlets {
     std::unique_ptr<TableView> list;
     std::unique_ptr<TextField> field;
@@ -33,14 +33,14 @@ public:
     virtual ~Toolkit() = default;
     virtual const TextMetrics& textMetrics() const = 0;
     virtual Rect screenBounds() const = 0;
-    /// The screen less what the system shows on it (a status bar).
+    /// The screen without the area of system elements such as a status bar.
     virtual Rect applicationFrame() const = 0;
 
     virtual std::unique_ptr<Window> makeWindow(const Rect& bounds) = 0;
     virtual std::unique_ptr<NavigationStack>
     makeNavigationStack(std::shared_ptr<TableScreen> root) = 0;
     virtual std::unique_ptr<ScreenView> makeScreenView() = 0;
-    /// `source` is only kept, not called: its maker is still being constructed.
+    /// `source` is only stored, not called: its owner is still being constructed.
     virtual std::unique_ptr<TableView> makeTableView(TableSource& source) = 0;
     /// Lays out a modal screen by the name of its interface resource.
     virtual ModalOutlets loadLayout(std::string_view name, TableSource& source) = 0;

@@ -23,7 +23,7 @@ struct Label {
     Rect frame;
 };
 
-/// Shows a part of something wider than itself.
+/// Shows a part of wider content.
 struct ScrollContainer {
     Rect frame;
     Size contentSize;
@@ -31,7 +31,7 @@ struct ScrollContainer {
 
 enum class IndicatorStyle { Gray, White };
 
-/// Turns while something is under way.
+/// Turns during an operation.
 struct ActivityIndicator {
     IndicatorStyle style = IndicatorStyle::Gray;
     bool isSpinning = false;
@@ -51,7 +51,7 @@ using BarItems = std::vector<BarItem>; ///< from left to right
 struct Alert {
     std::string title;
     std::string message;
-    std::string button; ///< the only one; it closes the alert
+    std::string button; ///< the only button; it closes the alert
 };
 
 } // namespace pallax::ui
