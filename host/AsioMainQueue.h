@@ -22,7 +22,7 @@ public:
 
     void async(Block block) override;
     void after(std::chrono::nanoseconds delay, Block block) override;
-    /// A firing that the queue was too busy for is left out; the later ones keep to the grid.
+    /// If the queue was busy at a firing, that firing is skipped; later ones keep to the grid.
     std::unique_ptr<RepeatingTimer> scheduleRepeating(std::chrono::nanoseconds interval,
                                                       std::function<void()> action) override;
 
@@ -30,8 +30,8 @@ public:
     bool runReady() override;
     void stop() override;
 
-    /// Calls `action` as a block for each of these signals, instead of what they do by default.
-    /// A later call replaces an earlier one.
+    /// Calls `action` as a block for each of these signals, instead of their default action. A
+    /// later call replaces an earlier one.
     void onSignal(std::initializer_list<int> signals, std::function<void(int)> action);
 
 private:
@@ -40,19 +40,19 @@ private:
     std::unique_ptr<Impl> _impl;
 };
 
-/// Waits for a file descriptor that somebody else owns; to be destroyed before the descriptor is
-/// closed. Its destruction drops what is being waited for.
+/// Waits for a file descriptor that it does not own; must be destroyed before the descriptor is
+/// closed. Destruction cancels a pending wait.
 class DescriptorWatch {
 public:
-    /// Throws std::system_error for a descriptor that cannot be waited for.
+    /// Throws std::system_error for a descriptor that cannot be watched.
     DescriptorWatch(AsioMainQueue& queue, int descriptor);
     ~DescriptorWatch();
     DescriptorWatch(const DescriptorWatch&) = delete;
     DescriptorWatch& operator=(const DescriptorWatch&) = delete;
 
-    /// Calls `action` once, as a block, when there is something to read (the end included).
+    /// Calls `action` once, as a block, when there is data to read or the end has been reached.
     void onceReadable(std::function<void()> action);
-    /// Calls `action` once, as a block, when there is room to write.
+    /// Calls `action` once, as a block, when it is possible to write.
     void onceWritable(std::function<void()> action);
 
 private:

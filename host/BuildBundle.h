@@ -4,7 +4,7 @@
 
 namespace pallax {
 
-/// The version of the project and the moment at which this file was compiled.
+/// The version of the project and the time at which this file was compiled.
 class BuildBundle final : public Bundle {
 public:
     std::optional<std::string> version() const override;

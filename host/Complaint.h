@@ -2,14 +2,14 @@
 
 #include <string_view>
 
-/// What is told on standard error. File names, settings and what another process sends may stand in
-/// it, so it is written as a terminal may get it, wherever it goes.
+/// Messages on standard error. They may contain file names, settings and texts of other processes,
+/// so they are always escaped as for a terminal.
 namespace pallax {
 
-/// "pallax: " and the sentence, in one line.
+/// Prints "pallax: " and the sentence, in one line.
 void complain(std::string_view sentence);
 
-/// Lines that name the program already.
+/// Prints lines that already start with the program's name.
 void passOnComplaints(std::string_view lines);
 
 } // namespace pallax

@@ -6,22 +6,22 @@
 
 namespace pallax {
 
-/// The resources, which are display templates, as files of one folder.
+/// The resources (display templates) as files of one folder.
 class DirectoryResources final : public Resources {
 public:
     explicit DirectoryResources(std::string folder) : _folder(std::move(folder)) {}
 
-    /// Where this program's resources lie: `$PALLAX_RESOURCES`, else where `folderFor` says.
+    /// The folder of this program's resources: `$PALLAX_RESOURCES`, else the result of `folderFor`.
     static std::string programFolder();
-    /// `share/pallax` in the program's own folder, as a build folder has it, where there is one;
-    /// else `../share/pallax` seen from that folder, as an installation has it.
+    /// `share/pallax` in the program's own folder if it exists (a build folder), otherwise
+    /// `../share/pallax` relative to that folder (an installation).
     static std::string folderFor(const std::string& program);
 
     const std::string& folder() const { return _folder; }
 
-    /// The resource of that name, a dictionary; an error names the file and the reason.
+    /// The resource with this name, a dictionary; an error names the file and the reason.
     Result<PropertyList, HostError> load(std::string_view name) const;
-    /// As `propertyListPaths`, but a folder that cannot be read to its end is an error.
+    /// Like `propertyListPaths`, but a folder that cannot be read completely is an error.
     Result<std::vector<std::string>, HostError> list() const;
 
     std::optional<PropertyList> propertyList(std::string_view name) const override;

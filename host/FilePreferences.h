@@ -17,10 +17,10 @@ public:
 
     void setValue(std::string_view key, const PropertyList& value,
                   std::string_view domain) override;
-    /// Writes the values set since the last time into the domain's file, where the other values
-    /// stay as they are. False too when the present file cannot be read: it is left alone.
+    /// Writes the values set since the last call to the domain's file, which keeps its other
+    /// values. False, leaving the file unchanged, if the current file cannot be read.
     bool synchronize(std::string_view domain) override;
-    /// Does nothing: on Linux nobody listens, readers look into the file.
+    /// Does nothing: on Linux there are no listeners; readers read the file.
     void postChangedNotice(std::string_view domain, std::string_view key) override;
 
 private:

@@ -5,18 +5,17 @@
 
 namespace pallax {
 
-/// Why something of the host could not be had: one clear sentence for the user, without a newline.
+/// Why the host could not provide something: one sentence for the user, without a newline.
 struct HostError {
     std::string sentence;
-    /// What was written to is a pipe that nobody reads any more, or not in time once a signal has
-    /// asked for the end: a reason to end quietly.
+    /// The reader of a pipe has gone, or has not read in time after a signal: exit quietly.
     bool readerHasGone = false;
 };
 
-/// That a recording cannot be written, as the system's error number tells.
+/// The error of a recording that cannot be written, from the system's error number.
 HostError unwritableRecording(std::string_view name, int error);
-/// That the reader of a recording does not take it, although the program has to end; `isWhole`
-/// where it has got whole packets.
+/// The error of a recording whose reader does not read although the program must end; `isWhole` if
+/// the reader received only whole packets.
 HostError untakenRecording(std::string_view name, bool isWhole);
 
 } // namespace pallax

@@ -4,7 +4,7 @@
 
 namespace pallax {
 
-/// The machine's files.
+/// The file system of this machine.
 class HostFileSystem final : public FileSystem {
 public:
     bool exists(const std::string& path) const override;

@@ -4,44 +4,44 @@
 
 namespace pallax {
 
-/// Lets a signal that asks the program to end (SIGINT, SIGTERM, SIGHUP, SIGQUIT) reach a program
-/// that waits for its own output: in a pipe that nobody empties, or on a terminal that Ctrl-S has
-/// stopped. The main queue, which handles the signal, does not run meanwhile.
+/// Lets a signal that ends the program (SIGINT, SIGTERM, SIGHUP, SIGQUIT) reach a program that is
+/// blocked on its own output: a full pipe, or a terminal stopped with Ctrl-S. The main queue, which
+/// handles the signal, does not run during the blocked write.
 ///
-/// When the program has not ended half a second after the first such signal, each of its blocked
-/// system calls fails with EINTR, again and again, until it has. Whoever repeats an interrupted
-/// call asks `isDue` first. A program that SIGQUIT has asked dies of it at the end.
+/// Half a second after the first such signal, each blocked system call fails with EINTR,
+/// repeatedly, until the program has ended. Code that retries interrupted calls must check `isDue`
+/// first. After SIGQUIT, the program finally dies of it.
 ///
 /// One at a time, from before the main queue until after the last output.
 class Interruption {
 public:
     struct Patience {
-        /// What is taken by then is written as without the signal.
+        /// Output accepted before this is written as usual.
         std::chrono::milliseconds untilDue;
-        /// A program that SIGQUIT has not ended by then dies of it wherever it is.
+        /// After this time, SIGQUIT kills the program wherever it is.
         std::chrono::milliseconds untilDeath;
     };
     static constexpr Patience kPatience{std::chrono::milliseconds(500),
                                         std::chrono::milliseconds(3000)};
 
-    /// What the signal handlers do to the terminal that is drawn on; safe in a signal handler.
+    /// What the signal handlers do to the terminal; must be safe in a signal handler.
     struct Terminal {
-        void (*release)(); ///< lets output go on that is held back
-        void (*restore)(); ///< leaves the terminal as it was
+        void (*release)(); ///< unblocks pending output
+        void (*restore)(); ///< restores the terminal
     };
 
     explicit Interruption(Terminal terminal = {nullptr, nullptr}, Patience patience = kPatience);
-    /// Dies of SIGQUIT where that is the signal.
+    /// Dies of SIGQUIT if that was the signal.
     ~Interruption();
     Interruption(const Interruption&) = delete;
     Interruption& operator=(const Interruption&) = delete;
 
-    /// To be called once the signal's handler is installed, which goes on hearing of it. Does
-    /// nothing for other signals, nor while no Interruption lives.
+    /// Call this once the signal's handler is installed; the handler still receives the signal.
+    /// Does nothing for other signals, or without an Interruption.
     static void watch(int signal);
-    /// The first of those signals that has come; 0 when none has.
+    /// The first of those signals received; 0 if none.
     static int signal();
-    /// Whether interrupted calls are given up.
+    /// Whether interrupted calls must give up.
     static bool isDue();
 };
 

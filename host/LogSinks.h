@@ -10,16 +10,16 @@
 #include <string>
 #include <string_view>
 
-/// Where the system log goes on Linux. A priority is passed on as the number it is; one beyond
-/// the levels (16) names, to syslog, a facility with the level 0.
+/// The sinks of the system log on Linux. A priority is passed on unchanged; for syslog, one beyond
+/// the levels (16) is a facility with level 0.
 namespace pallax {
 
-/// "<4>text" and a newline; a text that ends in one gets no second.
+/// "<4>text" and a newline, unless the text already ends in one.
 std::string logLine(LogPriority priority, std::string_view text);
 
 class SyslogSink final : public LogSink {
 public:
-    /// `identity` stands before every line of the log.
+    /// `identity` precedes every line of the log.
     explicit SyslogSink(std::string identity);
     ~SyslogSink() override;
     SyslogSink(const SyslogSink&) = delete;
@@ -30,8 +30,8 @@ private:
     std::string _identity; // syslog keeps a pointer to it
 };
 
-/// Lines on standard error. Where that is a terminal, what a modem's text could tell it to do is
-/// replaced; a file gets every byte.
+/// Lines on standard error. On a terminal, characters that could command it are escaped; a file
+/// gets every byte.
 class StderrSink final : public LogSink {
 public:
     StderrSink();
@@ -42,27 +42,27 @@ private:
     bool _isTerminal;
 };
 
-/// Lines in a file, which is emptied first; a terminal in its place gets what commands it as
-/// escapes. They are written through when the sink is destroyed and whenever the buffer is full.
+/// Lines in a file, which is truncated first; if it is a terminal, characters that could command it
+/// are escaped. The buffer is written when it is full and on destruction.
 class FileSink final : public LogSink {
 public:
     static Result<std::unique_ptr<FileSink>, HostError> create(const std::string& path);
-    /// On a descriptor, of which it uses a duplicate.
+    /// Writes to a duplicate of the descriptor.
     static Result<std::unique_ptr<FileSink>, HostError> onto(int descriptor);
     ~FileSink() override;
     FileSink(const FileSink&) = delete;
     FileSink& operator=(const FileSink&) = delete;
     void write(LogPriority priority, std::string_view text) override;
-    /// Lines as another sink has written them.
+    /// Appends lines that another sink has formatted.
     void append(std::string_view lines);
-    /// Writes what is buffered; false when any line could not be written.
+    /// Writes the buffer; false if any line could not be written.
     bool flush();
 
 private:
     explicit FileSink(std::FILE* file);
     std::FILE* _file;
     bool _isTerminal;
-    PrintablePieces _pieces; ///< of what goes to a terminal
+    PrintablePieces _pieces; ///< of the output to a terminal
 };
 
 } // namespace pallax

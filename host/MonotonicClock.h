@@ -6,7 +6,7 @@
 
 namespace pallax {
 
-/// A clock for durations: it counts from no date in particular, and nobody can set it back.
+/// A clock for durations: its start is arbitrary, and it never goes back.
 class MonotonicClock final : public Clock {
 public:
     Time now() const override { return Time(std::chrono::steady_clock::now().time_since_epoch()); }

@@ -16,43 +16,43 @@
 namespace pallax {
 
 /// Writes a recording as pcapng, little-endian on every machine: one section, one interface, stamps
-/// in nanoseconds. Each packet reaches the file before the next is taken, in one piece: a crash
-/// loses at most the last one, and where a packet cannot be written whole (a full disk) the file is
-/// cut back to the packet before.
+/// in nanoseconds. Each packet is written to the file in one piece before the next is taken: a
+/// crash loses at most the last one, and if a packet cannot be written completely (a full disk) the
+/// file is cut back to the previous packet.
 ///
-/// A file is locked while it is written. A file that was there before keeps its content until the
-/// first packet comes, and a new file that gets none is removed at the end.
+/// The file is locked while it is written. An existing file keeps its content until the first
+/// packet arrives, and a new file that gets none is removed at the end.
 class PcapNgWriter {
 public:
-    /// The largest packet that readers of captures accept.
+    /// The largest packet that capture readers accept.
     static constexpr std::size_t kLargestPacket = 262144;
 
     enum class Existing { Keep, Overwrite };
 
-    /// `path` "-" is standard output. With Keep, a file that exists is an error; a file that
-    /// another writer has locked always is.
+    /// `path` "-" is standard output. With Keep, an existing file is an error; a file locked by
+    /// another writer always is.
     static Result<std::unique_ptr<PcapNgWriter>, HostError> create(const std::string& path,
                                                                    Existing existing);
     ~PcapNgWriter();
     PcapNgWriter(const PcapNgWriter&) = delete;
     PcapNgWriter& operator=(const PcapNgWriter&) = delete;
 
-    /// What all packets are of: the interface's link type and name. Once, before the first of them.
+    /// Sets the interface's link type and name, for all packets. Once, before the first packet.
     std::optional<HostError> begin(int linkType, std::string_view name);
-    /// A packet of at most kLargestPacket bytes; a time before 1970 is written as 1970. Nothing
-    /// when it is written, else why it is not; then nothing more can be written.
+    /// Writes a packet of at most kLargestPacket bytes; a time before 1970 is written as 1970.
+    /// Returns nothing on success, otherwise an error; then nothing more can be written.
     std::optional<HostError> write(Time time, Bytes packet);
-    /// Nothing while the path leads to what was written; else that the file was removed, moved,
-    /// replaced or changed meanwhile, so that its packets may be lost.
+    /// Nothing if the path still leads to the unchanged file; otherwise an error that the file was
+    /// removed, moved, replaced or changed, so packets may be lost.
     std::optional<HostError> interference() const;
 
     const std::string& name() const { return _name; } ///< the path; "standard output" for "-"
-    /// False for standard output, pipes and devices, beside which no other file belongs.
+    /// False for standard output, pipes and devices, which cannot have further files next to them.
     bool isFile() const { return _isFile; }
     std::uint64_t packets() const { return _packets; }
     /// Bytes in the file.
     std::uint64_t size() const { return _size; }
-    /// How many bytes a packet of `length` bytes takes.
+    /// The bytes in the file for a packet of `length` bytes.
     static std::uint64_t sizeOfPacket(std::size_t length);
 
 private:
@@ -65,12 +65,12 @@ private:
 
     std::string _name;
     Descriptor _file;     // empty for standard output
-    int _number;          // of the descriptor that is written to
-    bool _isFile = false; // a regular one
-    dev_t _device = 0;    // which one
+    int _number;          // the descriptor for writing
+    bool _isFile = false; // it is a regular file
+    dev_t _device = 0;    // its device
     ino_t _inode = 0;
-    bool _isNew = false;   // made here
-    bool _isBegun = false; // what was in it before is gone
+    bool _isNew = false;   // this writer created it
+    bool _isBegun = false; // its old content is gone
     std::uint64_t _size = 0;
     std::uint64_t _packets = 0;
 };

@@ -10,34 +10,34 @@
 #include <optional>
 #include <string_view>
 
-/// How messages are framed on a message port's socket, little-endian:
+/// The frames on a message port's socket, little-endian:
 ///
 ///   offset  width  field
 ///   0       4      magic, "PLXM"
 ///   4       2      kind, see FrameKind
-///   6       2      flags; bit 0: the source is live, its times are those of its stamps and drive
-///                  no timers; the others are zero
+///   6       2      flags; bit 0: the source is live, its times are its stamps and drive no
+///                  timers; the others are zero
 ///   8       4      message identifier, signed
-///   12      4      length of the data that follows the header, at most 16 MiB
+///   12      4      length of the data after the header, at most 16 MiB
 ///   16      8      source time: signed nanoseconds since the epoch; the smallest number: none
-///   24      4      number: a reply carries that of its request; a message that of its packet in
-///                  the source, counted from 1 (0: not told); a remark that of the packet that it
-///                  is about; otherwise zero
+///   24      4      number: in a reply, that of its request; in a message, that of its packet in
+///                  the source, counted from 1 (0: unknown); in a remark, that of its packet;
+///                  otherwise zero
 ///   28      4      reserved, zero
 ///
 /// The data of a remark are its kind, 4 bytes, and its size in nanoseconds, 8 bytes.
 ///
-/// A peer that sends anything else is cut off.
+/// A peer that sends anything else is disconnected.
 namespace pallax {
 
 enum class FrameKind : std::uint16_t {
-    Message = 1, ///< no reply wanted
-    Request = 2, ///< a reply is wanted
+    Message = 1, ///< without a reply
+    Request = 2, ///< wants a reply
     Reply = 3,
-    NoReply = 4, ///< the receiver of a request has nothing to answer
-    Clock = 5,   ///< no data: the source's clock stands at the source time
-    End = 6,     ///< no data: the source has come to its end
-    Remark = 7,  ///< what is odd about a packet's stamp, see StampRemark
+    NoReply = 4, ///< the receiver of a request does not answer it
+    Clock = 5,   ///< no data: the source's clock is at the source time
+    End = 6,     ///< no data: the source has ended
+    Remark = 7,  ///< something odd about a packet's stamp, see StampRemark
 };
 
 inline constexpr std::size_t kFrameHeaderSize = 32;
@@ -66,24 +66,24 @@ std::array<std::uint8_t, kFrameHeaderSize> encodeHeader(const FrameHeader& heade
                                                         std::size_t length);
 /// The data of a remark's frame.
 ByteBuffer encodeRemark(const StampRemark& remark);
-/// Nothing for what is no remark.
+/// Nothing if the data are not a remark.
 std::optional<StampRemark> decodeRemark(Bytes data);
 /// Appends a whole frame.
 void appendFrame(ByteBuffer& out, const FrameHeader& header, Bytes data);
 
-/// Puts frames together from whatever pieces a socket gives. It never holds more memory than
-/// twice what it was fed of the present frame, whatever length the header claims.
+/// Assembles frames from pieces of any size. Its memory is at most twice the bytes received of the
+/// current frame, even if the header claims more.
 class PortFrameParser {
 public:
-    /// Takes bytes from the front of `bytes`, up to the end of one frame, and says how many. It
-    /// takes none while a whole frame waits to be taken, and none after a fault.
+    /// Takes bytes from the front of `bytes`, up to the end of one frame, and returns how many.
+    /// Takes none while a complete frame waits for `take`, and none after a fault.
     std::size_t feed(Bytes bytes);
-    /// The frame that has become whole, once.
+    /// The complete frame, once.
     std::optional<PortFrame> take();
-    /// What the peer did wrong ("an unknown kind of frame"); empty while nothing.
+    /// What the peer did wrong ("an unknown kind of frame"); empty without a fault.
     std::string_view fault() const { return _fault; }
-    /// True in the middle of a frame: a stream that ends here is cut. For tests and fuzz targets; a
-    /// port takes the end of a stream as the end wherever it comes.
+    /// True in the middle of a frame: a stream that ends here is truncated. For tests and fuzz
+    /// targets; a port accepts the end of a stream anywhere.
     bool isInsideFrame() const { return _headerSize > 0 && !_whole; }
 
 private:
@@ -93,7 +93,7 @@ private:
 
     std::array<std::uint8_t, kFrameHeaderSize> _headerBytes{};
     std::size_t _headerSize = 0;
-    std::size_t _length = 0; // of the data, once the header is whole
+    std::size_t _length = 0; // of the data, once the header is complete
     PortFrame _frame;
     bool _whole = false;
     std::string_view _fault;

@@ -9,17 +9,17 @@
 
 namespace pallax {
 
-/// What recordings are read from. A stream (a named pipe, a device, a shell's `<(command)`) can be
+/// The input of a recording. A stream (a named pipe, a device, a shell's `<(command)`) can be
 /// opened once and read once.
 struct RecordingFile {
-    /// So long a stream may give nothing before that is told.
+    /// How long a stream may be silent before that is reported.
     static constexpr std::chrono::milliseconds kPatience{2000};
 
-    /// Whether the path leads to a stream; so does "-". False for what is not there.
+    /// Whether the path leads to a stream; true for "-", false if nothing is there.
     static bool isStream(const std::string& path);
 
-    /// Opens a path (not "-"). A stream is returned once there is something to read, or its end;
-    /// `waiting`, if any, hears that nobody has written yet.
+    /// Opens a path (not "-"). For a stream, returns once there is data to read, or its end;
+    /// `waiting`, if any, is told that there is no writer yet.
     static Result<RecordingFile, RecordingError>
     open(const std::string& path, const Recording::Waiting& waiting,
          std::chrono::milliseconds patience = kPatience);

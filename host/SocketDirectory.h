@@ -10,26 +10,26 @@
 
 namespace pallax {
 
-/// The user's private folder of sockets, one file per named port:
-/// `$XDG_RUNTIME_DIR/pallax`, or `/tmp/pallax-UID` when that variable is unset.
+/// The user's private folder of sockets, one file for each named port: `$XDG_RUNTIME_DIR/pallax`,
+/// or `/tmp/pallax-UID` if that variable is unset.
 class SocketDirectory {
 public:
-    /// The lock is kept for a moment only. A service waits for it while a client waits for the
-    /// service, which is to answer within a second.
+    /// The lock is held only briefly. A service waits for it while a client waits for the service,
+    /// which must answer within a second.
     static constexpr std::chrono::milliseconds kLockPatience{300};
 
-    /// Made with mode 0700 when it is missing. Refused: a folder whose parent is missing, a
-    /// symbolic link, another user's folder, one that others may enter.
+    /// Created with mode 0700 if missing. Refuses a folder without a parent, a symbolic link,
+    /// another user's folder, and one that others may enter.
     static Result<SocketDirectory, HostError> open();
 
     const std::string& path() const { return _path; }
-    /// Where the socket of the port `name` lies; an error when that name is too long for a socket.
+    /// The path of the socket of port `name`; an error if the name is too long for a socket.
     Result<std::string, HostError> socketPath(std::string_view name) const;
 
-    /// While the result lives, no other process creates or removes a socket here. Empty when the
-    /// folder has gone, or when another process keeps the lock for longer than kLockPatience.
+    /// While the result lives, no other process creates or removes a socket here. Empty if the
+    /// folder has gone, or another process holds the lock for longer than kLockPatience.
     Descriptor lock() const;
-    /// Removes the sockets that nobody listens on any more: what a killed process left behind.
+    /// Removes sockets without a listener, left by killed processes.
     void removeStaleSockets() const;
 
 private:

@@ -11,8 +11,8 @@ namespace pallax {
 class AsioMainQueue;
 class SourceTimeListener;
 
-/// A named port: a listening socket and the connections that were made to it. Its destruction
-/// ends it without a call of the invalidation callback.
+/// A named port: a listening socket and its connections. Destruction ends it without calling the
+/// invalidation callback.
 class SocketLocalPort final : public LocalMessagePort {
 public:
     struct Setup {
@@ -23,7 +23,7 @@ public:
         SourceTimeListener* times; ///< may be null
     };
 
-    /// An inert port: it never was valid.
+    /// An inert port, which was never valid.
     SocketLocalPort() = default;
     explicit SocketLocalPort(Setup setup);
     ~SocketLocalPort() override;

@@ -10,21 +10,21 @@ namespace pallax {
 class AsioMainQueue;
 class SourceTimeListener;
 
-/// Named message ports as Unix-domain sockets. A port's messages are read only as fast as they
-/// are processed, so a slow receiver slows its senders down. What a port does besides delivering
-/// messages happens on `queue`. Queue and listener outlive the ports made here.
+/// Named message ports as Unix-domain sockets. A port reads messages only as fast as they are
+/// processed, so a slow receiver slows its senders down. Apart from delivering messages, ports work
+/// on `queue`. Queue and listener must outlive the ports.
 class SocketMessagePorts final : public MessagePorts {
 public:
-    /// `listener`, which may be null, hears the source times of what arrives on local ports.
+    /// `listener`, which may be null, receives the source times that arrive on local ports.
     SocketMessagePorts(AsioMainQueue& queue, SocketDirectory directory,
                        SourceTimeListener* listener = nullptr);
 
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override;
 
-    /// Whether a living port has that name, even one that takes no connection now.
+    /// Whether a living port has this name, even if it accepts no connection now.
     bool isTaken(std::string_view name) const;
-    /// Why the latest createLocal gave no port: one sentence.
+    /// Why the latest createLocal failed: one sentence.
     const std::string& lastError() const { return _lastError; }
     const SocketDirectory& directory() const { return _directory; }
 

@@ -9,9 +9,9 @@ namespace pallax {
 
 class AsioMainQueue;
 
-/// A connection to a named port. Requests go one at a time; a reply is matched to its request by
-/// number, so one that comes too late is dropped. When the peer ends the connection the port
-/// becomes invalid and the invalidation callback is called as a block of the queue.
+/// A connection to a named port. Requests go one at a time; replies are matched to requests by
+/// number, so a late reply is dropped. When the peer ends the connection, the port becomes invalid
+/// and calls the invalidation callback as a block of the queue.
 class SocketRemotePort final : public RemoteMessagePort {
 public:
     SocketRemotePort(AsioMainQueue& queue, Descriptor socket);

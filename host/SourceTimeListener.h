@@ -7,23 +7,22 @@
 
 namespace pallax {
 
-/// Hears the source times that arrive on a local port, in order.
+/// Receives the source times that arrive on a local port, in order.
 class SourceTimeListener {
 public:
     virtual ~SourceTimeListener() = default;
-    /// A new connection begins to tell the time; its times need not follow the earlier ones. The
-    /// times of a live source are its stamps, and whatever they do, the present goes on.
+    /// A new connection starts to send times, which need not follow the earlier ones. The times of
+    /// a live source are its stamps and do not affect the present.
     virtual void sourceBegan(bool isLive) = 0;
-    /// One step towards `time`. True: something fell due before it and was done; what that
-    /// posted on the main queue comes first, then this is to be called again from a later block.
-    /// False: the clock stands at `time`.
+    /// One step towards `time`. True: a tick before `time` was due and has run; blocks that it
+    /// posted on the main queue come first, then call this again from a later block. False: the
+    /// clock is at `time`.
     virtual bool advance(Time time) = 0;
-    /// The message that is delivered next is that packet of its source, counted from 1; 0 when
-    /// the source does not say.
+    /// The next message is the packet with this number in its source, counted from 1; 0 if unknown.
     virtual void packetNumber(std::uint32_t number) = 0;
-    /// The stamp of the packet with that number is odd; nothing but a sentence need come of it.
+    /// The stamp of the packet with this number is odd; listeners may just report it.
     virtual void stampRemark(std::uint32_t packet, const StampRemark& remark) = 0;
-    /// The source has come to its end.
+    /// The source has ended.
     virtual void sourceEnded() = 0;
 };
 

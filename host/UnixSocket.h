@@ -11,20 +11,20 @@
 /// Unix-domain stream sockets: never blocking, closed on exec, without SIGPIPE.
 namespace pallax {
 
-/// The longest name that a socket can have in any folder, in bytes.
+/// The maximum length of a socket's name in any folder, in bytes.
 std::size_t longestSocketName();
 
-/// Whether somebody listens at `path`, as a connection attempt finds it.
+/// Whether a process listens at `path`, determined by connecting.
 enum class Listener { Living, Stale, None };
 Listener listenerAt(const std::string& path);
 
-/// A socket that listens at `path`, which must not exist, with mode 0600; empty on failure
-/// (errno says why).
+/// A socket listening at `path`, which must not exist, with mode 0600; empty on failure (errno says
+/// why).
 Descriptor listenAt(const std::string& path);
 /// A connection to the listener at `path`, which must belong to this user; empty otherwise.
 Descriptor connectTo(const std::string& path);
-/// The next connection of this user's; connections of another user are closed at once. Empty
-/// with errno EAGAIN when there is none now.
+/// The next connection by this user; connections by other users are closed at once. Empty with
+/// errno EAGAIN if there is none.
 Descriptor acceptFrom(const Descriptor& listener);
 
 /// The outcome of one attempt to move bytes.
@@ -34,10 +34,10 @@ struct Transfer {
     std::size_t count = 0;
 };
 Transfer receiveFrom(const Descriptor& socket, std::span<std::uint8_t> buffer);
-/// Both parts as one stream of bytes; `count` is over both.
+/// Both parts as one stream of bytes; `count` covers both.
 Transfer sendTo(const Descriptor& socket, Bytes first, Bytes second = {});
-/// What was sent and lies unread in the receiver's buffer, in bytes with what the kernel needs for
-/// them; 0 when the receiver has read everything.
+/// Bytes sent but not yet read by the receiver, including the kernel's overhead; 0 if the receiver
+/// has read everything.
 std::size_t unreadByReceiver(const Descriptor& socket);
 
 } // namespace pallax

@@ -11,8 +11,8 @@ namespace pallax {
 /// Base64 in one line, padded.
 std::string base64Text(Bytes bytes);
 
-/// The bytes behind a base64 text, in which white space may stand anywhere. Nothing when the
-/// text is anything else: other characters, padding missing or inside, bits left over.
+/// Decodes a base64 text, which may contain white space anywhere. Nothing for invalid texts: other
+/// characters, missing or misplaced padding, extra bits.
 std::optional<ByteBuffer> parseBase64(std::string_view text);
 
 } // namespace pallax

@@ -8,8 +8,8 @@
 
 namespace pallax {
 
-/// Reads at offsets inside bytes that somebody else owns. A read that does not lie wholly inside
-/// them gives nothing.
+/// Reads at offsets of bytes that it does not own. A read that is not entirely inside them returns
+/// nothing.
 class ByteReader {
 public:
     explicit ByteReader(Bytes bytes) : _bytes(bytes) {}

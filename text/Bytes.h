@@ -7,10 +7,10 @@
 
 namespace pallax {
 
-/// Bytes that somebody else owns. A null message is an empty span.
+/// Bytes owned elsewhere. A null message is an empty span.
 using Bytes = std::span<const std::uint8_t>;
 
-/// Bytes that we own.
+/// Owned bytes.
 using ByteBuffer = std::vector<std::uint8_t>;
 
 /// Immutable bytes shared by several owners (a property list's data value).

@@ -12,7 +12,7 @@ namespace pallax {
 
 class Text;
 
-/// One argument of `formatText`; converts from whatever a log line names.
+/// One argument of `formatText`; converts from every type that log lines use.
 class FormatArgument {
 public:
     template <std::integral Integer>
@@ -23,7 +23,7 @@ public:
     FormatArgument(const char* text) : _value(std::string_view(text)) {}
     FormatArgument(const void* address) : _value(address) {}
     FormatArgument(const Text& text);
-    /// An object's printed form, for %@; made when the text is.
+    /// An object's printed form, for %@; made only when needed.
     template <class Described>
     requires requires(const Described& object) {
         { object.description() } -> std::same_as<std::string>;
@@ -33,7 +33,7 @@ public:
                             return static_cast<const Described*>(described)->description();
                         }}) {}
 
-    /// An object, and what prints it.
+    /// An object and its printing function.
     struct Object {
         const void* object;
         std::string (*description)(const void* object);
@@ -46,11 +46,11 @@ private:
 };
 
 /// printf in the C locale, with two additions of the system's vocabulary: %@ takes any text or
-/// object, and arguments carry their type (a conversion that does not fit its argument prints
-/// the argument as what it is). An argument that is missing prints nothing.
+/// object, and arguments carry their type (a conversion that does not fit its argument prints the
+/// argument by its own type). A missing argument prints nothing.
 std::string formatText(std::string_view format, std::initializer_list<FormatArgument> arguments);
 
-/// "<01000000 1641>": the textual dump of raw bytes, in groups of four.
+/// "<01000000 1641>": a dump of raw bytes, in groups of four.
 std::string dumpOf(const std::uint8_t* data, std::size_t size);
 
 } // namespace pallax

@@ -7,7 +7,7 @@
 
 namespace pallax {
 
-/// One conversion of a printf format ("%+5.2lf"), taken apart.
+/// One conversion of a printf format ("%+5.2lf"), parsed.
 struct NumberConversion {
     bool leftAlign = false;
     bool plusSign = false;
@@ -18,10 +18,10 @@ struct NumberConversion {
     int width = 0;
     int precision = -1;   ///< -1: none given
     char conversion = 0;  ///< d i u x X f c s p @
-    std::size_t size = 0; ///< characters of the format text that it takes, "%" included
+    std::size_t size = 0; ///< its length in the format text, including "%"
 };
 
-/// Sets what a flag character of a conversion asks for; false when it is none.
+/// Sets the flag of a conversion; false if the character is not a flag.
 constexpr bool takeFlag(NumberConversion& conversion, char flag) {
     switch (flag) {
     case '-':
@@ -44,8 +44,8 @@ constexpr bool takeFlag(NumberConversion& conversion, char flag) {
     }
 }
 
-/// Reads the conversion that starts at the "%" at `start`. Throws std::invalid_argument (a
-/// compile error in a constant expression) on a conversion that this project does not use.
+/// Reads the conversion that starts at the "%" at `start`. Throws std::invalid_argument (a compile
+/// error in a constant expression) for a conversion that this project does not use.
 constexpr NumberConversion parseConversion(std::string_view format, std::size_t start) {
     NumberConversion result;
     std::size_t at = start + 1;
@@ -83,13 +83,13 @@ constexpr NumberConversion parseConversion(std::string_view format, std::size_t 
     return result;
 }
 
-/// A printf format for exactly one number ("%4.2f dBm"), taken apart at compile time, with the
-/// unit of what it shows. The texts it makes are those of printf in the C locale, whatever the
-/// user's locale is; a not-a-number prints "nan", never "-nan".
+/// A printf format for exactly one number ("%4.2f dBm"), parsed at compile time, with the unit of
+/// the number. Its texts are those of printf in the C locale, independent of the user's locale;
+/// not-a-number prints "nan", never "-nan".
 class NumberFormat {
 public:
-    /// The unit is the text after the number where that stands apart by a blank ("dBm"), or "%".
-    /// The text must live as long as the program.
+    /// The unit is the text after the number if a blank separates it ("dBm"), or "%". The text must
+    /// live as long as the program.
     consteval explicit NumberFormat(std::string_view printfText)
         : NumberFormat(printfText, unitOf(suffixOf(printfText))) {}
 
@@ -106,7 +106,7 @@ public:
     constexpr bool isReal() const { return _conversion.conversion == 'f'; }
     constexpr std::string_view unit() const { return _unit; }
     constexpr const NumberConversion& conversion() const { return _conversion; }
-    /// What stands before and behind the number, as in the format: "%%" is one per cent sign.
+    /// The texts before and after the number, as in the format: "%%" is one per cent sign.
     constexpr std::string_view prefix() const { return _prefix; }
     constexpr std::string_view suffix() const { return _suffix; }
 
@@ -135,20 +135,20 @@ private:
         return suffix.size() > 1 && suffix.front() == ' ' ? suffix.substr(1) : std::string_view();
     }
 
-    std::string_view _prefix; // may hold "%%", as does the suffix
+    std::string_view _prefix; // like the suffix, may contain "%%"
     std::string_view _suffix;
     std::string_view _unit;
     NumberConversion _conversion;
 };
 
-/// Appends one number as `conversion` asks, in the C locale.
+/// Appends one number formatted by `conversion`, in the C locale.
 void appendConverted(std::string& out, const NumberConversion& conversion, std::int64_t number);
 void appendConverted(std::string& out, const NumberConversion& conversion, double number);
 
 /// Appends `text` padded to the conversion's width and cut to its precision.
 void appendConverted(std::string& out, const NumberConversion& conversion, std::string_view text);
 
-/// A number and how it is shown: the value of a display row, whose text is made when it is read.
+/// A number with its format: the value of a display row, formatted when it is read.
 class DisplayNumber {
 public:
     /// `format` must live as long as the program; a temporary is refused.
@@ -159,7 +159,7 @@ public:
             _integer = number;
         }
     }
-    /// A real under an integer's format is cut toward zero.
+    /// With an integer's format, a real is truncated toward zero.
     DisplayNumber(double number, const NumberFormat& format) : _format(&format) {
         if (format.isReal()) {
             _real = number;
@@ -179,7 +179,7 @@ public:
     std::int64_t integer() const { return _integer; } ///< only when not isReal()
     double real() const { return _real; }             ///< only when isReal()
 
-    /// True when both print the same text for certain; false may still mean the same text.
+    /// True only if both print the same text; false does not mean that the texts differ.
     bool sameNumberAndFormat(const DisplayNumber& other) const;
 
 private:

@@ -5,7 +5,7 @@
 
 namespace pallax {
 
-/// A value, or why there is none. Value and error must be different types.
+/// A value or an error. Their types must differ.
 template <class Value, class Error>
 class [[nodiscard]] Result {
 public:
@@ -14,13 +14,13 @@ public:
 
     explicit operator bool() const { return _content.index() == 0; }
 
-    /// Only when the result is true.
+    /// Only if the result is true.
     const Value& value() const& { return std::get<0>(_content); }
     Value&& value() && { return std::get<0>(std::move(_content)); }
     const Value& operator*() const& { return value(); }
     const Value* operator->() const { return &value(); }
 
-    /// Only when the result is false.
+    /// Only if the result is false.
     const Error& error() const { return std::get<1>(_content); }
 
 private:

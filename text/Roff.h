@@ -5,9 +5,9 @@
 
 namespace pallax {
 
-/// A text as roff, the language of manual pages, shows it again: a hyphen stays what is typed,
-/// nothing is a request or an escape, and what is beyond ASCII is named by its number. Bytes that
-/// are no UTF-8 stay as they are.
+/// Escapes a text for roff, the language of manual pages: hyphens can be typed as shown, nothing is
+/// a request or an escape, and characters beyond ASCII are written by number. Bytes that are not
+/// UTF-8 are kept.
 std::string roffText(std::string_view text);
 
 /// The same in bold type.

@@ -7,23 +7,23 @@
 
 namespace pallax {
 
-/// What a text file may begin with to say that it is UTF-8.
+/// The byte order mark with which a UTF-8 file may start.
 constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
 
-/// One code point of a UTF-8 text and the bytes that it takes; 0 bytes where the text is no UTF-8.
+/// One code point of a UTF-8 text and its length in bytes; 0 bytes if the text is not UTF-8.
 struct Utf8CodePoint {
     char32_t value = 0;
     std::size_t size = 0;
 };
 
-/// The code point that starts at `at`, which must lie inside `text`. Overlong forms, surrogates
-/// and numbers beyond U+10FFFF are no UTF-8.
+/// The code point that starts at `at`, which must be inside `text`. Overlong forms, surrogates and
+/// numbers beyond U+10FFFF are invalid.
 Utf8CodePoint utf8At(std::string_view text, std::size_t at);
 
-/// Where `text` ceases to be UTF-8, or nothing.
+/// The first position at which `text` is not UTF-8, if any.
 std::optional<std::size_t> invalidUtf8At(std::string_view text);
 
-/// `codePoint` must be one: at most U+10FFFF and no surrogate.
+/// `codePoint` must be valid: at most U+10FFFF and not a surrogate.
 void appendUtf8(std::string& out, char32_t codePoint);
 
 constexpr bool isHighSurrogate(char32_t unit) {
