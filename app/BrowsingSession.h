@@ -100,7 +100,7 @@ private:
     Files _files;
     PallaxApp _app;
     std::unique_ptr<RepeatingTimer> _looks;
-    bool _wasGone = false; ///< the source, at the latest look
+    bool _wasGone = false; ///< the source, at an earlier look
     bool _hasLostSource = false;
 };
 

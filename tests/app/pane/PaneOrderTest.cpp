@@ -58,6 +58,11 @@ TEST(PaneOrderTest, EqualRowsKeepTheDisplaysOrderBothWays) {
                                     leafNode("b", dbm(0))};
     EXPECT_EQ(inOrder(rows, {By::Value}), "b c a");
     EXPECT_EQ(inOrder(rows, {By::Value, true}), "c a b");
+    PaneModel many(treeNode("Section", std::vector<NodeRef>(100, leafNode("A", dbm(1)))), "/");
+    many.setOrder({By::Value, true});
+    for (std::size_t row = 0; row < many.shownRows(); ++row) {
+        EXPECT_EQ(many.rowAt(row), row);
+    }
 }
 
 TEST(PaneOrderTest, WhatIsNoNumberStandsAmongTheTexts) {
