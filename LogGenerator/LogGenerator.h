@@ -14,6 +14,7 @@ class Clock;
 class LogGenerator;
 class Resources;
 class SampleSink;
+class SectionAges;
 class StandardOutput;
 
 /// What a generator needs of its surroundings. All of it outlives the generator.
@@ -59,6 +60,9 @@ public:
     /// Gives the samples of later packets to `sink`, too, until it is null. The caller begins and
     /// ends the packets. The sink outlives the generator, or is taken away.
     virtual void setSampleSink(SampleSink* /*sink*/) {}
+    /// When the display's values were last read, for a generator that knows it; else null. Valid as
+    /// long as the generator.
+    virtual const SectionAges* sectionAges() const { return nullptr; }
     /// Brings the live display up to the latest packet, for whoever looks at it, or at the history,
     /// without generating it: a generator may read a packet as late as that.
     virtual void catchUp() {}

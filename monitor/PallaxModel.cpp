@@ -1,5 +1,6 @@
 #include "monitor/PallaxModel.h"
 
+#include "platform/Clock.h"
 #include "platform/MainQueue.h"
 
 #include <utility>
@@ -7,8 +8,8 @@
 namespace pallax {
 
 PallaxModel::PallaxModel(const Platform& platform, ModelObserver& observer)
-    : _queue(platform.queue), _observer(observer), _link(platform, *this),
-      _alive(std::make_shared<PallaxModel*>(this)) {}
+    : _queue(platform.queue), _clock(platform.generators.clock), _observer(observer),
+      _link(platform, *this), _alive(std::make_shared<PallaxModel*>(this)) {}
 
 void PallaxModel::generatorChosen(const std::string& technology) {
     _observer.generatorChosen(technology, _driver.keepsDisplay());
@@ -24,7 +25,32 @@ void PallaxModel::displayTick() {
         if (const auto alive = model.lock()) {
             (*alive)->_observer.updateViewControllerFromModel();
         }
+        if (const auto alive = model.lock()) { // the observer may end the model
+            (*alive)->handOutFrame();
+        }
     });
+}
+
+void PallaxModel::handOutFrame() {
+    std::erase_if(_frameObservers, [](const auto& observer) { return observer.expired(); });
+    if (_frameObservers.empty()) {
+        _frame.reset();
+        return;
+    }
+    NodeRef root = topLevelNodes();
+    if (_frame && _frame->root() == root) { // two ticks before the queue got here
+        return;
+    }
+    _frame = std::make_shared<Frame>(Frame::Picture{std::move(root), _nodesByPath, _clock.now()},
+                                     _frame.get(), _driver.sectionAges());
+    // Copies, because an observer may add another or end the model.
+    const FrameRef frame = _frame;
+    const auto observers = _frameObservers;
+    for (const auto& each : observers) {
+        if (const auto observer = each.lock()) {
+            observer->frameMade(frame);
+        }
+    }
 }
 
 NodeRef PallaxModel::topLevelNodes() {
@@ -34,7 +60,7 @@ NodeRef PallaxModel::topLevelNodes() {
     if (_driver.generator() == nullptr) {
         return nullptr;
     }
-    auto paths = std::make_unique<PathDictionary>();
+    auto paths = std::make_shared<PathDictionary>();
     _nodes = PallaxModelNode::makeTreeFromObject(_driver.generate(), *paths);
     _nodesByPath = std::move(paths);
     return _nodes;

@@ -2,6 +2,7 @@
 
 #include "app/tree/PallaxModelNode.h"
 #include "monitor/DisplayDriver.h"
+#include "monitor/Frame.h"
 #include "monitor/ModemLink.h"
 #include "plist/PropertyList.h"
 
@@ -10,6 +11,7 @@
 #include <string>
 #include <string_view>
 #include <utility>
+#include <vector>
 
 namespace pallax {
 
@@ -63,6 +65,13 @@ public:
     /// The live display, with every packet that has arrived; null while there is none.
     PropertyList display() { return _driver.display(); }
 
+    /// From the next display tick with new data on the observer gets the tick's frame, once the
+    /// model's observer has been told, for as long as the observer lives. Frames are made only
+    /// while somebody observes; their tree is that of `topLevelNodes`.
+    void observeFrames(std::weak_ptr<FrameObserver> observer) {
+        _frameObservers.push_back(std::move(observer));
+    }
+
 private:
     void setGenerator(std::unique_ptr<LogGenerator> generator) override {
         _driver.setGenerator(std::move(generator));
@@ -71,12 +80,16 @@ private:
     void generatorChosen(const std::string& technology) override;
     void packetArrived(Bytes packet) override { updateWithData(packet); }
     void displayTick() override;
+    void handOutFrame();
 
     MainQueue& _queue;
+    const Clock& _clock;
     ModelObserver& _observer;
     DisplayDriver _driver;
     NodeRef _nodes;
-    std::unique_ptr<PathDictionary> _nodesByPath;
+    std::shared_ptr<const PathDictionary> _nodesByPath;
+    std::vector<std::weak_ptr<FrameObserver>> _frameObservers;
+    FrameRef _frame; // that was handed out last
     ModemLink _link;
     /// Blocks on the queue hold it weakly: after the model's end they do nothing.
     std::shared_ptr<PallaxModel*> _alive;
