@@ -72,8 +72,8 @@ std::string luaLabels(const ShownAs& shownAs) {
 void addShownAs(LuaTable& table, const ShownAs& shownAs) {
     if (shownAs.format != nullptr) {
         table.raw("format", luaFormat(*shownAs.format));
-        if (shownAs.factor != 1.0) {
-            table.number("factor", shownAs.factor);
+        if (shownAs.scale() != 1.0) {
+            table.number("factor", shownAs.scale());
         }
         if (shownAs.offset != 0.0) {
             table.number("offset", shownAs.offset);

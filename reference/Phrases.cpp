@@ -57,8 +57,8 @@ std::string quoted(std::string_view text) {
 /// "raw x 0.25 - 140"
 std::string scaledOf(const ShownAs& shownAs) {
     std::string text("raw");
-    if (shownAs.factor != 1.0) {
-        text.append(" x ").append(decimal(shownAs.factor));
+    if (shownAs.scale() != 1.0) {
+        text.append(" x ").append(decimal(shownAs.scale()));
     }
     if (shownAs.offset != 0.0) {
         text.append(shownAs.offset < 0.0 ? " - " : " + ")

@@ -1,13 +1,12 @@
-#include "LogGenerator/C2K/OneXStatus.h"
-
 #include "LogGenerator/C2K/C2KDescription.h"
 #include "LogGenerator/C2K/C2KFormats.h"
 #include "LogGenerator/C2K/C2KLabels.h"
 #include "LogGenerator/C2K/C2KLookup.h"
+#include "LogGenerator/C2K/OneXStatus.h"
 #include "LogGenerator/C2K/PilotList.h"
-#include "LogGenerator/C2K/Subpackets.h"
 #include "LogGenerator/C2K/TrafficFER.h"
 #include "LogGenerator/Records/EntryList.h"
+#include "LogGenerator/Records/Subpackets.h"
 #include "platform/SystemLog.h"
 
 #include <cmath>

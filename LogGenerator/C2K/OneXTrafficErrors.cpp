@@ -1,9 +1,8 @@
-#include "LogGenerator/C2K/OneXTrafficErrors.h"
-
 #include "LogGenerator/C2K/C2KLookup.h"
-#include "LogGenerator/C2K/Subpackets.h"
+#include "LogGenerator/C2K/OneXTrafficErrors.h"
 #include "LogGenerator/C2K/TrafficFER.h"
 #include "LogGenerator/Records/Description.h"
+#include "LogGenerator/Records/Subpackets.h"
 #include "platform/SystemLog.h"
 
 namespace pallax {

@@ -13,10 +13,11 @@ namespace pallax {
 /// How a raw number becomes a display value: a label, or a number with its format. Formats and
 /// tables live as long as the program.
 struct Conversion {
-    /// Of a number: raw × factor + offset, computed in double precision and cut toward zero where
-    /// the format is an integer's. Null for a label.
+    /// Of a number: raw × factor / divisor + offset, computed in double precision and cut toward
+    /// zero where the format is an integer's. Null for a label.
     const NumberFormat* format = nullptr;
     double factor = 1.0;
+    double divisor = 1.0; ///< for decimal fractions, which no factor is exactly
     double offset = 0.0;
 
     /// labels[raw + shift]; with a shift other than 0 the index is cut to 8 bits, so that the byte
@@ -69,6 +70,13 @@ struct Conversion {
         return result;
     }
 
+    /// This conversion of a number, with the divisor.
+    constexpr Conversion dividedBy(double by) const {
+        Conversion result = *this;
+        result.divisor = by;
+        return result;
+    }
+
     /// This conversion for every raw value but `raw`, which shows `text` ("Not Present").
     constexpr Conversion except(std::int64_t raw, std::string_view text) const {
         Conversion result = *this;
@@ -78,6 +86,8 @@ struct Conversion {
     }
 
     SampleValue valueOf(std::int64_t raw) const;
+    /// By what a raw number is multiplied, for those who tell it.
+    constexpr double scale() const { return factor / divisor; }
 };
 
 inline SampleValue Conversion::valueOf(std::int64_t raw) const {
@@ -85,9 +95,9 @@ inline SampleValue Conversion::valueOf(std::int64_t raw) const {
         return SampleValue::label(exceptionalText);
     }
     if (format != nullptr) {
-        const bool plain = factor == 1.0 && offset == 0.0;
+        const bool plain = factor == 1.0 && divisor == 1.0 && offset == 0.0;
         return plain ? DisplayNumber(raw, *format)
-                     : DisplayNumber(static_cast<double>(raw) * factor + offset, *format);
+                     : DisplayNumber(static_cast<double>(raw) * factor / divisor + offset, *format);
     }
     const auto index = static_cast<std::uint64_t>(raw) + shift;
     const std::size_t entry = shift == 0 ? index : static_cast<std::uint8_t>(index);

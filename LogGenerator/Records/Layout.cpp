@@ -51,10 +51,14 @@ std::size_t rowCount(std::span<const ListLayout> lists) {
     return rows;
 }
 
+std::size_t rowCount(const SubpacketLayout& subpacket) {
+    return subpacket.fields.size() + rowCount(subpacket.lists);
+}
+
 std::size_t rowCount(const CodeLayout& code) {
     std::size_t rows = code.fields.size() + rowCount(code.lists);
     for (const SubpacketLayout& subpacket : code.subpackets) {
-        rows += subpacket.fields.size() + rowCount(subpacket.lists);
+        rows += rowCount(subpacket);
     }
     return rows;
 }

@@ -78,6 +78,7 @@ struct Place {
     LogRecord here;   ///< what the field stands in
     LogRecord record; ///< all of it
     LogRecord companion = {};
+    LogRecord around = {}; ///< of an entry: what its list stands in
     RecordMemory* memory = nullptr;
 };
 
@@ -287,6 +288,7 @@ struct RecordLayout {
 
 /// How many rows of fields there are: each field of each list once.
 std::size_t rowCount(std::span<const ListLayout> lists);
+std::size_t rowCount(const SubpacketLayout& subpacket);
 std::size_t rowCount(const CodeLayout& code);
 
 /// Whether `minimumLength`, `exactLength` and `condition` allow the record.

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Records/Layout.h"
 #include "LogGenerator/Records/Sample.h"
+#include "LogGenerator/Records/Subpackets.h"
 #include "plist/PropertyList.h"
 #include "text/Format.h"
 
@@ -36,6 +37,9 @@ public:
             return readListPart(code);
         }
         readIn(record, code.fields, code.lists);
+        for (const SubpacketLayout& subpacket : code.subpackets) {
+            readSubpacket(subpacket);
+        }
     }
 
     /// The fields and lists of a part of the record, such as a subpacket.
@@ -51,6 +55,14 @@ private:
     void give(const Field& field, FieldId id, std::optional<std::int64_t> raw,
               const SampleValue& value) {
         _sink.sample({id, field, raw, value});
+    }
+
+    void readSubpacket(const SubpacketLayout& subpacket) {
+        const FieldId behind = _next + static_cast<FieldId>(rowCount(subpacket));
+        if (const auto place = findSubpacket(_place.record, subpacket.id)) {
+            readIn(*place, subpacket.fields, subpacket.lists);
+        }
+        _next = behind;
     }
 
     void readFields(const LogRecord& place, std::span<const Field> fields) {
@@ -69,7 +81,7 @@ private:
 
     void readSpecial(const Field& field, FieldId id, const LogRecord& place) {
         if (field.condition != nullptr) {
-            const std::int64_t number = place.read(field.condition->position);
+            const std::int64_t number = numberOf(*field.condition, place);
             if (!field.condition->holdsFor(number)) {
                 return giveOtherwise(field, id, number);
             }
@@ -86,6 +98,14 @@ private:
         } else if (!value.isNull()) {
             give(field, id, std::nullopt, SampleValue::object(value));
         }
+    }
+
+    std::int64_t numberOf(const Condition& condition, const LogRecord& place) const {
+        if (!condition.subpacket) {
+            return place.read(condition.position);
+        }
+        const auto other = findSubpacket(_place.record, *condition.subpacket);
+        return other ? other->read(condition.position) : 0;
     }
 
     void giveOtherwise(const Field& field, FieldId id, std::int64_t number) {
@@ -112,26 +132,26 @@ private:
     void readEntries(const ListLayout& list, const LogRecord& place, FieldId first) {
         const EntryList entries = list.entriesIn(place);
         const std::size_t whole = list.passesSizeCheck(place) ? entries.wholeCount() : 0;
-        const std::optional<EntryList> companions =
-            list.companion
-                ? std::optional<EntryList>(std::in_place, place, list.companion->layoutIn(place),
-                                           entries.count())
-                : std::nullopt;
+        // No optional: of its content the compiler says that it may not be initialized.
+        const EntryList companions =
+            list.companion ? EntryList(place, list.companion->layoutIn(place), entries.count())
+                           : EntryList({}, {}, 0);
         _sink.beginList({list.key, &list, whole});
         for (std::size_t index = 0; index < whole; ++index) {
             const LogRecord entry = entries.at(index);
             if (list.only != nullptr && !list.only->holdsIn(entry)) {
                 continue;
             }
-            if (companions) {
-                if (!companions->isWhole(index)) {
+            if (list.companion) {
+                if (!companions.isWhole(index)) {
                     break; // it is part of the entry
                 }
-                _place.companion = companions->at(index);
+                _place.companion = companions.at(index);
             }
             if (!holdsItsFields(list, entry)) {
                 break;
             }
+            _place.around = place;
             _next = first;
             _sink.beginEntry(index, list.entryName ? entry.read(*list.entryName) : 0);
             readIn(entry, list.fields, list.lists);

@@ -1,10 +1,6 @@
 #pragma once
 
-#include "tests/doubles/SubpacketBuilder.h"
-
-#include <rapidcheck.h>
-
-#include <cstdint>
+#include "tests/doubles/AnySubpacket.h"
 
 namespace pallax::doubles {
 
@@ -54,16 +50,6 @@ inline Record oneXStatus(unsigned state, const Subpacket& activeSet = noPilots()
 /// 0x119D: a frame of the traffic channel.
 inline Record trafficFrame(unsigned inError) {
     return packetOf(0x119D, {Subpacket(5), Subpacket(11).padTo(24).u8(inError)});
-}
-
-/// A subpacket of any bytes; to be called inside a property.
-inline Subpacket anySubpacket(unsigned id) {
-    constexpr int kMaximumBytes = 60;
-    Subpacket subpacket(id);
-    for (int count = *rc::gen::inRange(0, kMaximumBytes); count > 0; --count) {
-        subpacket.u8(*rc::gen::arbitrary<std::uint8_t>());
-    }
-    return subpacket;
 }
 
 } // namespace pallax::doubles

@@ -1,6 +1,6 @@
-#include "LogGenerator/C2K/Subpackets.h"
+#include "LogGenerator/Records/Subpackets.h"
 
-#include "tests/LogGenerator/C2K/OneXRecords.h"
+#include "tests/doubles/AnySubpacket.h"
 #include "tests/doubles/Property.h"
 #include "tests/doubles/RecordProperties.h"
 #include "tests/doubles/RecordingLog.h"

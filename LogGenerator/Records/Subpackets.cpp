@@ -1,4 +1,4 @@
-#include "LogGenerator/C2K/Subpackets.h"
+#include "LogGenerator/Records/Subpackets.h"
 
 #include "platform/SystemLog.h"
 
