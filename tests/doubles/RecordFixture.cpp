@@ -31,6 +31,7 @@ void SectionFixture::feed(const Record& record) {
 
 void SectionFixture::feed(const ByteBuffer& bytes, LogCode logCode) {
     _base->updateWithData(LogRecord(bytes), logCode);
+    _base->catchUp();
     lines = _log.take();
 }
 

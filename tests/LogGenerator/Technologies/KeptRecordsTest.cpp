@@ -64,8 +64,10 @@ void checkRecord(Base& prompt, Base& late) {
         code = anyCodeAfter(code, codes);
         const ByteBuffer bytes = doubles::anyCellsRecord(code);
         const LogRecord record(bytes);
-        RC_ASSERT(outcomeOf(SystemLog::kEverything, [&] { prompt.updateWithData(record, code); }) ==
-                  outcomeOf(kErrors, [&] { late.receive(record, code); }));
+        RC_ASSERT(outcomeOf(SystemLog::kEverything, [&] {
+                      prompt.updateWithData(record, code);
+                      prompt.catchUp();
+                  }) == outcomeOf(kErrors, [&] { late.receive(record, code); }));
         if (any::boolean()) {
             RC_ASSERT(outcomeOf(kErrors, [&late] { late.catchUp(); }) == Outcome());
             RC_ASSERT(shownLate.description() == shown.description());
