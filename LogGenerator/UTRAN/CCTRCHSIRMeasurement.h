@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -16,14 +16,9 @@ namespace pallax {
 ///   2     6 byte  SIR        list of six numbers, one a byte
 ///
 /// Short records and other codes are ignored silently.
-class CCTRCHSIRMeasurement final : public Base {
+class CCTRCHSIRMeasurement final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "CCTRCH SIR"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    CCTRCHSIRMeasurement();
 };
 
 } // namespace pallax

@@ -1,58 +1,67 @@
 #include "LogGenerator/UTRAN/GSMNeighbhorMeasurements.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "LogGenerator/Records/EntryList.h"
-#include "platform/SystemLog.h"
-
 #include <array>
 
 namespace pallax {
 
 namespace {
 
-constexpr LogCode kNeighboursLogCode = 0xD00E;
-constexpr auto kLogCodes = std::to_array<LogCode>({kNeighboursLogCode});
-constexpr std::size_t kMinimumLength = 17;
-
-constexpr std::size_t kCellCountOffset = 16;
-constexpr EntryList::Layout kCells{.start = 17, .stride = 8, .bytesRead = 8};
-
 constexpr auto kFields = std::to_array<Field>({
-    {"Cell ID", bitsAt(0, 0, 14), Conversion::number()},
-    {"Band Indicator", bitsAt(1, 6, 1), Conversion::number()},
-    {"BSIC Valid", bitsAt(1, 7, 1), Conversion::number()},
-    {"NCC", u8At(2), Conversion::number()},
-    {"BCC", u8At(3), Conversion::number()},
-    {"ARFCN", u16At(4), Conversion::number()},
-    {"RSSI", s16At(6), Conversion::number()},
+    {"Cell ID", bitsAt(0, 0, 14), Conversion::number(),
+     "Number of the neighbour in the record, 14 bits."},
+    Field{"Band Indicator", bitsAt(1, 6, 1), Conversion::number(),
+          "Which of the bands with the same channel numbers the ARFCN is of."}
+        .identifying(),
+    {"BSIC Valid", bitsAt(1, 7, 1), Conversion::number(),
+     "Whether the base station identity code has been read."},
+    Field{"NCC", u8At(2), Conversion::number(), "Network colour code."}.identifying(),
+    Field{"BCC", u8At(3), Conversion::number(), "Base station colour code."}.identifying(),
+    Field{"ARFCN", u16At(4), Conversion::number(), "ARFCN of the neighbour."}.identifying(),
+    {"RSSI", s16At(6), Conversion::number(),
+     "Received signal strength of the neighbour, as the modem counts it."},
 });
+
+constexpr auto kLists = std::to_array<ListLayout>({{
+    .entries = {{.start = 17, .stride = 8, .bytesRead = 8}},
+    .count = u8At(16),
+    .fields = kFields,
+    .isShown = false,
+}});
+
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = 0xD00E,
+    .name = "Measurement of the GSM neighbours",
+    .minimumLength = 17,
+    .lists = kLists,
+    .emptiesList = true,
+    .note = "Empties the list; the cells of the record are not shown.",
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "GSM Neighbor Cell List",
+    .logLine = "GSM Neighbor Cell List",
+    .kind = SectionKind::List,
+    .meaning = "The neighbours of GSM; they are read and kept from the display, so that the list "
+               "stays empty.",
+    .codes = kCodes,
+    .reportsOtherCodes = false,
+};
+
+Dictionary cellOf(const LogRecord& entry) {
+    Dictionary cell;
+    for (const Field& field : kFields) {
+        field.conversion.valueOf(entry.read(*field.position)).showIn(cell.valueToSet(field.key));
+    }
+    return cell;
+}
 
 } // namespace
 
-std::span<const LogCode> GSMNeighbhorMeasurements::getLogCodeArray() const {
-    return kLogCodes;
-}
+GSMNeighbhorMeasurements::GSMNeighbhorMeasurements() : LayoutRecord(kLayout) {}
 
 Array GSMNeighbhorMeasurements::cellsOf(const LogRecord& record) {
-    const EntryList cells(record, kCells, record.u8(kCellCountOffset));
-    return cells.map(
-        [](const LogRecord& entry, std::size_t /*index*/) { return entryOf(kFields, entry); });
-}
-
-void GSMNeighbhorMeasurements::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "GSM Neighbor Cell List");
-    if (logCode != kNeighboursLogCode || !record.has(kMinimumLength)) {
-        return;
-    }
-    clearList(); // the cells are for whoever asks for them, not for the display
-}
-
-RecordDescription GSMNeighbhorMeasurements::describe() const {
-    CodeDescription code{kNeighboursLogCode, kMinimumLength};
-    code.lists = {describeList("", kCells, u8At(kCellCountOffset), kFields)};
-    code.lists.front().isShown = false;
-    code.note = "Empties the list; the cells of the record are not shown.";
-    return {std::move(code)};
+    return kLists.front().entriesIn(record).map(
+        [](const LogRecord& entry, std::size_t /*index*/) { return cellOf(entry); });
 }
 
 } // namespace pallax

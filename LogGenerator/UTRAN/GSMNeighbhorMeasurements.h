@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -23,13 +23,9 @@ namespace pallax {
 ///   6          16     RSSI            signed
 ///
 /// Short records and other codes are ignored silently.
-class GSMNeighbhorMeasurements final : public Base {
+class GSMNeighbhorMeasurements final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "GSM Neighbor Cell List"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    RecordDescription describe() const override;
+    GSMNeighbhorMeasurements();
 
     /// The cells of a record of at least 17 bytes, up to the first that is not whole.
     static Array cellsOf(const LogRecord& record);

@@ -50,6 +50,7 @@ void logState(const LogRecord& record, const PropertyList& section) {
 
 constexpr auto kCodes = std::to_array<CodeLayout>({{
     .logCode = 0xD0E0,
+    .name = "State of the RRC connection",
     .minimumLength = LogRecord::kHeaderLength,
     .fields = kFields,
     .note = "A record of less than 15 bytes is reported and read all the same.",
@@ -60,6 +61,7 @@ constexpr auto kCodes = std::to_array<CodeLayout>({{
 constexpr RecordLayout kLayout{
     .section = "RRC Info",
     .logLine = "RRC Info",
+    .meaning = "State of the radio resource control.",
     .codes = kCodes,
     .reportsOtherCodes = false,
 };

@@ -1,43 +1,45 @@
 #include "LogGenerator/UTRAN/TRCHBLERMeasurement.h"
 
-#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/UTRAN/ChannelQuality.h"
-#include "platform/SystemLog.h"
+
+#include <array>
 
 namespace pallax {
 
 namespace {
 
 constexpr auto kFields = std::to_array<Field>({
-    {"TRCH ID", u8At(0), Conversion::number()},
-    {"TRCH BLER Measurement", u8At(1), Conversion::number()},
+    Field{"TRCH ID", u8At(0), Conversion::number(), "Identity of the transport channel."}
+        .identifying(),
+    {"TRCH BLER Measurement", u8At(1), Conversion::number(),
+     "Block error rate of the transport channel, as the modem counts it."},
 });
+
+constexpr auto kLists = std::to_array<ListLayout>({{
+    .entries = kTransportChannels,
+    .count = kTransportChannelCount,
+    .fields = kFields,
+}});
+
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = kChannelQualityLogCode,
+    .name = "Quality of the transport channels",
+    .minimumLength = kChannelQualityMinimumLength,
+    .lists = kLists,
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "TRCH BLER",
+    .logLine = "TRCH BLER Measurement",
+    .kind = SectionKind::List,
+    .meaning = "Block errors of the transport channels.",
+    .codes = kCodes,
+    .priority = LogPriority::Notice, // the one record that notes it
+    .reportsOtherCodes = false,
+};
 
 } // namespace
 
-std::span<const LogCode> TRCHBLERMeasurement::getLogCodeArray() const {
-    return kChannelQualityLogCodes;
-}
-
-void TRCHBLERMeasurement::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Notice, "TRCH BLER Measurement"); // the one record that notes it
-    if (logCode != kChannelQualityLogCode || !record.has(kChannelQualityMinimumLength)) {
-        return;
-    }
-    clearList();
-    replaceList(transportChannels(record), [](Dictionary& target, const LogRecord& entry) {
-        fillEntry(target, kFields, entry);
-    });
-}
-
-bool TRCHBLERMeasurement::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return logCode == kChannelQualityLogCode && record.has(kChannelQualityMinimumLength);
-}
-
-RecordDescription TRCHBLERMeasurement::describe() const {
-    CodeDescription code{kChannelQualityLogCode, kChannelQualityMinimumLength};
-    code.lists = {describeList("", kTransportChannels, kTransportChannelCount, kFields)};
-    return {std::move(code)};
-}
+TRCHBLERMeasurement::TRCHBLERMeasurement() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -14,14 +14,9 @@ namespace pallax {
 ///   1     8      TRCH BLER Measurement  number
 ///
 /// Short records and other codes are ignored silently.
-class TRCHBLERMeasurement final : public Base {
+class TRCHBLERMeasurement final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "TRCH BLER"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    TRCHBLERMeasurement();
 };
 
 } // namespace pallax

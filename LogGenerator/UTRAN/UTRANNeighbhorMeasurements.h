@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -20,14 +20,9 @@ namespace pallax {
 ///   3     7    1      inJDCS       "TRUE" or "FALSE"
 ///
 /// Short records and other codes are ignored silently.
-class UTRANNeighbhorMeasurements final : public Base {
+class UTRANNeighbhorMeasurements final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Neighbor Cell List"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    UTRANNeighbhorMeasurements();
 };
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -25,17 +25,9 @@ namespace pallax {
 ///                           Downlink UARFCN
 ///
 /// Short records and other codes are ignored silently.
-class UTRANServingCellInfo final : public Base {
+class UTRANServingCellInfo final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Serving Cell Info"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
-
-private:
-    void updateFromCellMonitor(const LogRecord& record);
-    void showServingCell(const PropertyList& cell);
+    UTRANServingCellInfo();
 };
 
 } // namespace pallax

@@ -87,10 +87,12 @@ TEST(TRCHBLERMeasurement, TheListStopsAtTheFirstChannelThatIsNotWhole) {
 TEST(TRCHBLERMeasurement, AChannelIndexAtTheCountThrows) {
     const ByteBuffer bytes = counts(0x80, 0x30).bytes();
     const LogRecord record{Bytes(bytes)};
-    EXPECT_NO_THROW((void)transportChannels(record).at(1));
-    EXPECT_THROW((void)transportChannels(record).at(2), ArrayOutOfBoundsException);
-    EXPECT_NO_THROW((void)compositeChannels(record).at(2));
-    EXPECT_THROW((void)compositeChannels(record).at(3), ArrayOutOfBoundsException);
+    const ListLayout transport{.entries = kTransportChannels, .count = kTransportChannelCount};
+    EXPECT_NO_THROW((void)transport.entriesIn(record).at(1));
+    EXPECT_THROW((void)transport.entriesIn(record).at(2), ArrayOutOfBoundsException);
+    const ListLayout composite{.entries = kCompositeChannels, .count = kCompositeChannelCount};
+    EXPECT_NO_THROW((void)composite.entriesIn(record).at(2));
+    EXPECT_THROW((void)composite.entriesIn(record).at(3), ArrayOutOfBoundsException);
 }
 
 TEST(TRCHBLERMeasurement, AnyBytesKeepItsEntriesWithinItsKeys) {
