@@ -1,11 +1,10 @@
 #pragma once
 
 #include "LogGenerator/Records/Formats.h"
-#include "plist/PropertyList.h"
 
 #include <string_view>
 
-/// The formats that several parsers share.
+/// The formats that several layouts share.
 namespace pallax {
 
 inline constexpr NumberFormat kSignedLevelDb{"%+.2f dB"};
@@ -13,8 +12,5 @@ inline constexpr NumberFormat kSignedLevelDbm{"%+.2f dBm"};
 
 /// Shown for what the phone measures only while it transmits.
 inline constexpr std::string_view kNotAvailable = "N/A";
-inline PropertyList notAvailable() {
-    return Text::fixed(kNotAvailable);
-}
 
 } // namespace pallax

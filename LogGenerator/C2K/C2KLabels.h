@@ -1,22 +1,12 @@
 #pragma once
 
-#include "plist/PropertyList.h"
+#include "LogGenerator/Records/Conversion.h"
 
 #include <array>
-#include <cstdint>
-#include <span>
 #include <string_view>
 
+/// The tables of labels, each with the format that an index beyond it is shown under.
 namespace pallax {
-
-/// Labels by index, and the format that an index beyond them is shown under.
-struct LabelTable {
-    std::span<const std::string_view> labels;
-    const NumberFormat* beyond;
-
-    /// `index` is unsigned; beyond the table it is shown signed, as "%d" does.
-    PropertyList valueOf(std::uint32_t index) const;
-};
 
 inline constexpr NumberFormat kReserved{"[Reserved %d]", ""};
 inline constexpr NumberFormat kBadValue{"[Bad Value %d]", ""};
@@ -31,7 +21,8 @@ inline constexpr auto kEVDODeviceStateLabels = std::to_array<std::string_view>({
     "Connected [5]",
 });
 static_assert(kEVDODeviceStateLabels.size() == 6);
-inline constexpr LabelTable kEVDODeviceStates{kEVDODeviceStateLabels, &kReserved};
+inline constexpr Conversion kEVDODeviceStates =
+    Conversion::label(kEVDODeviceStateLabels, kReserved);
 
 inline constexpr auto kEVDOSessionStateLabels = std::to_array<std::string_view>({
     "Closed [0]",
@@ -41,7 +32,8 @@ inline constexpr auto kEVDOSessionStateLabels = std::to_array<std::string_view>(
     "Open [4]",
 });
 static_assert(kEVDOSessionStateLabels.size() == 5);
-inline constexpr LabelTable kEVDOSessionStates{kEVDOSessionStateLabels, &kReserved};
+inline constexpr Conversion kEVDOSessionStates =
+    Conversion::label(kEVDOSessionStateLabels, kReserved);
 
 inline constexpr auto kBandClassLabels = std::to_array<std::string_view>({
     "800 MHz cellular band [0]",
@@ -59,7 +51,7 @@ inline constexpr auto kBandClassLabels = std::to_array<std::string_view>({
     "800 MHz European PAMR band [12]",
 });
 static_assert(kBandClassLabels.size() == 13);
-inline constexpr LabelTable kBandClasses{kBandClassLabels, &kBadValue};
+inline constexpr Conversion kBandClasses = Conversion::label(kBandClassLabels, kBadValue);
 
 inline constexpr auto kOneXDeviceStateLabels = std::to_array<std::string_view>({
     "Inactive [0]",
@@ -76,7 +68,8 @@ inline constexpr auto kOneXDeviceStateLabels = std::to_array<std::string_view>({
     "Powerup state [11]",
 });
 static_assert(kOneXDeviceStateLabels.size() == 12);
-inline constexpr LabelTable kOneXDeviceStates{kOneXDeviceStateLabels, &kBadValue};
+inline constexpr Conversion kOneXDeviceStates =
+    Conversion::label(kOneXDeviceStateLabels, kBadValue);
 
 /// The enhanced roaming indicator.
 inline constexpr auto kRoamingIndicatorLabels = std::to_array<std::string_view>({
@@ -95,6 +88,7 @@ inline constexpr auto kRoamingIndicatorLabels = std::to_array<std::string_view>(
     "Banner OFF [12]",
 });
 static_assert(kRoamingIndicatorLabels.size() == 13);
-inline constexpr LabelTable kRoamingIndicators{kRoamingIndicatorLabels, &kOtherRoamingIndicator};
+inline constexpr Conversion kRoamingIndicators =
+    Conversion::label(kRoamingIndicatorLabels, kOtherRoamingIndicator);
 
 } // namespace pallax

@@ -16,35 +16,22 @@
 
 #include <algorithm>
 #include <array>
-#include <utility>
 
 namespace pallax {
 
 namespace {
 
-/// Turns a packet into values under their lookup names; may keep running values in the state.
-struct Parser {
-    LogCode logCode;
-    void (*parse)(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
-    CodeDescription (*describe)(LogCode logCode);
-    /// Whether a packet replaces all that the one before it under the code has shown, and parsing
-    /// it logs nothing. Null for parsers that keep running values, whose every packet counts.
-    bool (*replacesShown)(const LogRecord& packet) = nullptr;
-};
-
 /// In the order in which the start command names the codes.
-constexpr auto kParsers = std::to_array<Parser>({
-    {0x108A, parseFingerC2I, describeFingerC2I, isWholeFingerC2I},
-    {0x1183, parseEVDOStatus, describeEVDOStatus, isWholeEVDOStatus},
-    {0x1192, parseForwardDataRate, describeForwardDataRate},
-    {0x12B6, parseEVDOActiveSet, describeEVDOActiveSet, isWholeEVDOActiveSet},
-    {0x119C, parseOneXStatus, describeOneXStatus},
-    {0x119D, parseOneXTrafficErrors, describeOneXTrafficErrors},
-    {0x127E, parseReverseDataRate, describeReverseDataRate},
-    {0x134F, parseOneXSystemIdentity, describeOneXSystemIdentity, isWholeOneXSystemIdentity},
+constexpr auto kCodes = std::to_array<const CodeLayout*>({
+    &kFingerC2I,
+    &kEVDOStatus,
+    &kForwardDataRate,
+    &kEVDOActiveSet,
+    &kOneXStatus,
+    &kOneXTrafficErrors,
+    &kReverseDataRate,
+    &kOneXSystemIdentity,
 });
-
-static_assert(kParsers.size() == C2KLogGenerator::kLogCodeCount);
 
 constexpr std::string_view kSorted = "_sorted";
 
@@ -56,6 +43,9 @@ DictionaryRef dictionaryUnder(std::string_view key, const Dictionary& state) {
 
 } // namespace
 
+C2KLogGenerator::C2KLogGenerator(const GeneratorEnvironment& environment)
+    : ZORLogGenerator(environment), _display(kCodes) {}
+
 C2KLogGenerator::~C2KLogGenerator() {
     C2KLogGenerator::catchUp(); // the display outlives its generator
 }
@@ -66,8 +56,8 @@ std::unique_ptr<LogGenerator> C2KLogGenerator::generator(const GeneratorEnvironm
 
 PropertyList C2KLogGenerator::getStartCommand() const {
     Array logCodes;
-    for (const Parser& parser : kParsers) {
-        logCodes.push_back(PropertyList::integer(parser.logCode));
+    for (const CodeLayout* code : kCodes) {
+        logCodes.push_back(PropertyList::integer(code->logCode));
     }
     return Dictionary{{"SetState", "Streaming"}, {"SetZorellLogCodes", std::move(logCodes)}};
 }
@@ -132,30 +122,21 @@ void C2KLogGenerator::updateFromLog(Bytes packet, const DictionaryRef& lookup, D
     if (type != LogRecord::kStandardType) {
         systemLog(LogPriority::Error, "Invalid log type: %x. Dropping.", type); // it is not
     }
-    const LogCode code = LogPacketGetLogCode(record);
-    const auto* parser = std::find_if(kParsers.begin(), kParsers.end(),
-                                      [code](const Parser& each) { return each.logCode == code; });
-    if (parser == kParsers.end()) {
+    const LogCode logCode = LogPacketGetLogCode(record);
+    const auto* code =
+        std::find_if(kCodes.begin(), kCodes.end(),
+                     [logCode](const CodeLayout* each) { return each->logCode == logCode; });
+    if (code == kCodes.end()) {
         return;
     }
-    if (parser->replacesShown != nullptr && parser->replacesShown(record)) {
-        Kept& kept = _kept[static_cast<std::size_t>(parser - kParsers.begin())];
-        kept.packet.assign(record.bytes().begin(), record.bytes().end());
-        kept.lookup = lookup;
-    } else {
-        const Dictionary nowhere;
-        parser->parse(record, state, lookup != nullptr ? *lookup : nowhere);
+    if ((*code)->accepts(**code, record)) {
+        _display.take(static_cast<std::size_t>(code - kCodes.begin()), record, lookup, state);
     }
     capture(record.bytes());
 }
 
 void C2KLogGenerator::catchUp() {
-    Dictionary noState; // what may be kept has no running values
-    for (std::size_t place = 0; place < kParsers.size(); ++place) {
-        if (const DictionaryRef lookup = std::exchange(_kept[place].lookup, nullptr)) {
-            kParsers[place].parse(LogRecord(_kept[place].packet), noState, *lookup);
-        }
-    }
+    _display.bringUpToDate();
 }
 
 PropertyList C2KLogGenerator::generateLogUsingState(Dictionary& state) {
@@ -172,9 +153,9 @@ bool C2KLogGenerator::keepsDisplay(const Dictionary& state) const {
 
 std::vector<CodeDescription> C2KLogGenerator::describe() {
     std::vector<CodeDescription> description;
-    description.reserve(kParsers.size());
-    for (const Parser& parser : kParsers) {
-        description.push_back(parser.describe(parser.logCode));
+    description.reserve(kCodes.size());
+    for (const CodeLayout* code : kCodes) {
+        description.push_back(pallax::describe(*code));
     }
     return description;
 }

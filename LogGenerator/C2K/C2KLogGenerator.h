@@ -1,10 +1,8 @@
 #pragma once
 
-#include "LogGenerator/Records/LogCode.h"
+#include "LogGenerator/C2K/LookupDisplay.h"
 #include "LogGenerator/ZORLogGenerator.h"
 
-#include <array>
-#include <cstddef>
 #include <memory>
 #include <vector>
 
@@ -13,22 +11,19 @@ namespace pallax {
 struct CodeDescription;
 
 /// The generator of the CDMA technology, 1x and EV-DO. It has no records with sections of their
-/// own: the parser of a log code stores each value under a lookup name, and the template
-/// "C2KTemplate" says where that name is shown, in as many places as it likes.
+/// own: the layout of a log code tells which value stands under which lookup name, and the
+/// template "C2KTemplate" says where that name is shown, in as many places as it likes.
 ///
 /// A template is a property list of dictionaries. In any of them a dictionary is a section, the
 /// string "_sorted" stands for itself, any other string is a lookup name, and the rest is ignored.
 ///
 /// The state's keys, beside those of every generator: "Lookup" (the lookup table, see C2KLookup.h)
-/// and the running values of the parsers.
+/// and the running values of the layouts.
 class C2KLogGenerator final : public ZORLogGenerator {
 public:
-    /// As many as there are parsers.
-    static constexpr std::size_t kLogCodeCount = 8;
-
     static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment);
 
-    using ZORLogGenerator::ZORLogGenerator;
+    explicit C2KLogGenerator(const GeneratorEnvironment& environment);
     ~C2KLogGenerator() override;
 
     void updateState(Dictionary& state, Bytes data) override;
@@ -45,21 +40,15 @@ public:
     /// The display, made on first use; null while the template cannot be loaded.
     PropertyList getDisplayFromState(Dictionary& state) const;
     /// Framing and dispatch of one packet. A packet of a known code is captured behind its prefix,
-    /// whether or not its parser accepts it; nothing else is captured. A wrong log type is
+    /// whether or not its layout accepts it; nothing else is captured. A wrong log type is
     /// reported, but does not stop the packet.
     void updateFromLog(Bytes packet, const DictionaryRef& lookup, Dictionary& state);
 
-    /// What the parsers read and show, out of the constants that they read with (Description.h).
+    /// What the layouts tell of the packets (Description.h).
     static std::vector<CodeDescription> describe();
 
 private:
-    /// The latest packet of a code whose every packet replaces what the one before has shown: it is
-    /// parsed when somebody looks. Null lookup: none.
-    struct Kept {
-        DictionaryRef lookup;
-        ByteBuffer packet;
-    };
-    std::array<Kept, kLogCodeCount> _kept; // in the order of the parsers
+    LookupDisplay _display;
 };
 
 } // namespace pallax

@@ -1,14 +1,10 @@
 #include "LogGenerator/C2K/DataRate.h"
 
-#include "LogGenerator/C2K/C2KLookup.h"
-
 #include <optional>
 
 namespace pallax {
 
 namespace {
-
-constexpr NumberFormat kRate{"%.2f kbps"};
 
 std::optional<std::int64_t> integerUnder(std::string_view key, const Dictionary& state) {
     const PropertyList* found = state.find(key);
@@ -33,39 +29,35 @@ std::int32_t stepsBetween(std::int64_t before, std::uint32_t now) {
 
 } // namespace
 
-void updateDataRate(const DataRateNames& names, std::uint32_t sequence, std::int64_t sent,
-                    Dictionary& state, const Dictionary& lookup) {
+PropertyList dataRateSince(const DataRateNames& names, std::uint32_t sequence, std::int64_t sent,
+                           Dictionary& state) {
     constexpr std::int64_t kUnitsPerKilobit = 1024;
     const auto sequenceBefore = integerUnder(names.sequence, state);
     const auto sentBefore = integerUnder(names.sent, state);
+    PropertyList rate;
     if (sequenceBefore && sentBefore) {
         const std::int64_t steps = stepsBetween(*sequenceBefore, sequence);
         if (steps >= 1) {
             const auto grown = static_cast<double>(sent - *sentBefore);
-            setLookupValue(
-                names.rate,
-                DisplayNumber(grown / static_cast<double>(steps * kUnitsPerKilobit), kRate),
-                lookup);
+            rate = DisplayNumber(grown / static_cast<double>(steps * kUnitsPerKilobit),
+                                 kDataRateFormat);
         }
         setExtraInfo(state, names.sequenceBefore, *sequenceBefore, names.sentBefore, *sentBefore);
     } else {
-        setLookupValue(names.rate, Text::fixed(""), lookup);
+        rate = Text::fixed("");
     }
     state.setFixed(names.sequence, PropertyList::integer(sequence));
     state.setFixed(names.sent, PropertyList::integer(sent));
     setExtraInfo(state, names.sequenceNow, sequence, names.sentNow, sent);
+    return rate;
 }
 
-FieldDescription describeDataRate(const DataRateNames& names, const Position& sequence,
-                                  const Extent& bytes, std::vector<Counter> counters) {
-    FieldDescription field =
-        describeComputed(names.rate, kRate, "data rate",
-                         "growth of the weighted sum of the counters since the packet before, "
-                         "divided by 1024 x the growth of the sequence number; empty at the first "
-                         "packet, unchanged where the number has not grown",
-                         {extentOf(sequence), bytes});
-    field.counters = std::move(counters);
-    return field;
+std::int64_t weightedSum(std::span<const Counter> counters, const LogRecord& packet) {
+    std::int64_t sum = 0;
+    for (const Counter& counter : counters) {
+        sum += packet.read(u32At(counter.byte)) * counter.weight;
+    }
+    return sum;
 }
 
 } // namespace pallax

@@ -1,12 +1,8 @@
 #pragma once
 
-#include "LogGenerator/Records/LogCode.h"
-#include "LogGenerator/Records/LogRecord.h"
-#include "plist/PropertyList.h"
+#include "LogGenerator/Records/Layout.h"
 
 namespace pallax {
-
-struct CodeDescription;
 
 /// The pilots of the EV-DO active set and their energies.
 ///
@@ -18,13 +14,6 @@ struct CodeDescription;
 ///   a pilot, 12 bytes
 ///   0     16     PN offset
 ///   2     16     energy: 10 x log10(raw / 512), dB
-void parseEVDOActiveSet(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
-
-/// Whether `parseEVDOActiveSet` accepts the packet; it then sets every value that it ever sets, and
-/// logs nothing.
-bool isWholeEVDOActiveSet(const LogRecord& packet);
-
-/// What that reads and shows, under the log code `logCode`.
-CodeDescription describeEVDOActiveSet(LogCode logCode);
+extern const CodeLayout kEVDOActiveSet;
 
 } // namespace pallax

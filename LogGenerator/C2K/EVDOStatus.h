@@ -1,12 +1,8 @@
 #pragma once
 
-#include "LogGenerator/Records/LogCode.h"
-#include "LogGenerator/Records/LogRecord.h"
-#include "plist/PropertyList.h"
+#include "LogGenerator/Records/Layout.h"
 
 namespace pallax {
-
-struct CodeDescription;
 
 /// The state of the EV-DO protocol, its carrier and its levels.
 ///
@@ -22,13 +18,6 @@ struct CodeDescription;
 ///   37    0    8      kSessionState        EV-DO session state label
 ///   38    0    24     kUATI24              0x and six hexadecimal digits
 ///   41    0    8      kColorCode           number
-void parseEVDOStatus(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
-
-/// Whether `parseEVDOStatus` accepts the packet; it then sets every value that it ever sets, and
-/// logs nothing.
-bool isWholeEVDOStatus(const LogRecord& packet);
-
-/// What that reads and shows, under the log code `logCode`.
-CodeDescription describeEVDOStatus(LogCode logCode);
+extern const CodeLayout kEVDOStatus;
 
 } // namespace pallax

@@ -1,66 +1,61 @@
 #include "LogGenerator/C2K/FingerC2I.h"
 
-#include "LogGenerator/C2K/C2KDescription.h"
-#include "LogGenerator/C2K/C2KFormats.h"
-#include "LogGenerator/C2K/C2KLookup.h"
-#include "LogGenerator/C2K/PilotList.h"
+#include "LogGenerator/C2K/PacketLength.h"
+#include "LogGenerator/C2K/PilotEnergy.h"
 #include "platform/SystemLog.h"
+
+#include <array>
 
 namespace pallax {
 
 namespace {
 
-constexpr std::size_t kFingerCount = 22;
-constexpr std::size_t kFingers = 23;
+constexpr std::size_t kFingersStart = 23;
 constexpr std::size_t kFingerLength = 14;
 
-// From a finger's start.
-constexpr std::size_t kPN = 0;
-constexpr std::size_t kCarrierToInterference = 6;
+constexpr Position kPN = u16At(0);
+constexpr std::int64_t kUnlocked = 0xFFFF;
+constexpr Condition kIsLocked{kPN, 0, kUnlocked - 1};
 
-constexpr std::uint16_t kUnlocked = 0xFFFF;
+/// The carrier to interference.
+constexpr auto kFingerFields =
+    std::to_array<Field>({computed({}, kSignedLevelDb, kPilotEnergy<6>)});
+
+constexpr auto kLists = std::to_array<ListLayout>({{
+    .key = "kFingerC2I",
+    .entries = {{.start = kFingersStart, .stride = kFingerLength, .bytesRead = kFingerLength}},
+    .count = u8At(22),
+    .fields = kFingerFields,
+    .meaning = "Carrier to interference at each finger of the receiver that is locked, by PN "
+               "offset.",
+    .fit = ListLayout::Fit::Exact,
+    .only = &kIsLocked,
+    .entryName = kPN,
+    .ifEmpty = kNoPilots,
+}});
+
+bool hasItsFingers(const CodeLayout& code, const LogRecord& packet) {
+    if (!hasLength(code, packet)) {
+        return false;
+    }
+    const std::size_t count = kLists.front().countIn(packet);
+    const bool has = packet.length() == kFingersStart + count * kFingerLength;
+    if (!has) {
+        systemLog(LogPriority::Error,
+                  "Log code 0x108a has bad length of %u bytes, but has %d substructs (size=%lu).",
+                  packet.length(), count, kFingersStart);
+    }
+    return has;
+}
 
 } // namespace
 
-void parseFingerC2I(const LogRecord& packet, Dictionary& /*state*/, const Dictionary& lookup) {
-    if (!packet.has(kFingers)) {
-        systemLog(LogPriority::Error,
-                  "Log code 0x108a is %u bytes long but must be at least %lu bytes.",
-                  packet.length(), kFingers);
-        return;
-    }
-    const std::size_t count = packet.u8(kFingerCount);
-    if (packet.length() != kFingers + count * kFingerLength) {
-        systemLog(LogPriority::Error,
-                  "Log code 0x108a has bad length of %u bytes, but has %d substructs (size=%lu).",
-                  packet.length(), count, kFingers);
-        return;
-    }
-    PilotList fingers;
-    for (std::size_t index = 0; index < count; ++index) {
-        const LogRecord finger = packet.from(kFingers + index * kFingerLength);
-        const std::uint16_t pn = finger.u16(kPN);
-        if (pn != kUnlocked) {
-            fingers.add(
-                index, pn,
-                DisplayNumber(energyInDb(finger.u16(kCarrierToInterference)), kSignedLevelDb));
-        }
-    }
-    setLookupValue("kFingerC2I", fingers.listOrNone(), lookup);
-}
-
-bool isWholeFingerC2I(const LogRecord& packet) {
-    return packet.has(kFingers) &&
-           packet.length() == kFingers + packet.u8(kFingerCount) * kFingerLength;
-}
-
-CodeDescription describeFingerC2I(LogCode logCode) {
-    CodeDescription code{logCode, kFingers};
-    code.lists = {describePilots("kFingerC2I", {kFingers, kFingerLength, kFingerLength},
-                                 u8At(kFingerCount), u16At(kPN), u16At(kCarrierToInterference))};
-    code.lists.front().fit = ListDescription::Fit::Exact;
-    code.lists.front().only = Condition{u16At(kPN), 0, kUnlocked - 1};
-    return code;
-}
+constexpr CodeLayout kFingerC2I{
+    .logCode = 0x108A,
+    .name = "Fingers of the EV-DO receiver",
+    .minimumLength = kFingersStart,
+    .lists = kLists,
+    .accepts = hasItsFingers,
+};
 
 } // namespace pallax

@@ -1,12 +1,8 @@
 #pragma once
 
-#include "LogGenerator/Records/LogCode.h"
-#include "LogGenerator/Records/LogRecord.h"
-#include "plist/PropertyList.h"
+#include "LogGenerator/Records/Layout.h"
 
 namespace pallax {
-
-struct CodeDescription;
 
 /// What the fingers of the EV-DO receiver are locked to, and how well.
 ///
@@ -18,13 +14,6 @@ struct CodeDescription;
 ///   a finger, 14 bytes
 ///   0     16     PN offset; 0xFFFF: locked to nothing, not shown
 ///   6     16     carrier to interference: 10 x log10(raw / 512), dB
-void parseFingerC2I(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
-
-/// Whether `parseFingerC2I` accepts the packet; it then sets every value that it ever sets, and
-/// logs nothing.
-bool isWholeFingerC2I(const LogRecord& packet);
-
-/// What that reads and shows, under the log code `logCode`.
-CodeDescription describeFingerC2I(LogCode logCode);
+extern const CodeLayout kFingerC2I;
 
 } // namespace pallax

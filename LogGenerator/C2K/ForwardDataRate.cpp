@@ -1,9 +1,9 @@
 #include "LogGenerator/C2K/ForwardDataRate.h"
 
 #include "LogGenerator/C2K/DataRate.h"
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
+#include "LogGenerator/C2K/PacketLength.h"
 
+#include <algorithm>
 #include <array>
 
 namespace pallax {
@@ -11,8 +11,8 @@ namespace pallax {
 namespace {
 
 constexpr std::size_t kMinimumLength = 241;
-constexpr std::size_t kSequence = 13;
-constexpr std::size_t kCounters = 17;
+constexpr Position kSequence = u32At(13);
+constexpr std::size_t kCountersStart = 17;
 constexpr std::size_t kCounterLength = 4;
 
 /// What one step of each counter adds to the total; nothing where it is 0.
@@ -34,43 +34,53 @@ constexpr auto kWeights = std::to_array<std::uint16_t>({
     5120, 0,                   //
 });
 static_assert(kWeights.size() == 56);
-static_assert(kCounters + kWeights.size() * kCounterLength == kMinimumLength);
+static_assert(kCountersStart + kWeights.size() * kCounterLength == kMinimumLength);
 
-constexpr DataRateNames kNames = {"kFLDataRate", "FLDataSeqNum",  "FLDataSent", "FLDataSeqNum1",
-                                  "FLDataSent1", "FLDataSeqNum2", "FLDataSent2"};
-
-std::int64_t totalOf(const LogRecord& packet) {
-    std::int64_t sum = 0;
-    for (std::size_t counter = 0; counter < kWeights.size(); ++counter) {
-        sum += std::int64_t{packet.u32(kCounters + counter * kCounterLength)} * kWeights[counter];
+/// The counters that have a weight.
+constexpr auto kCounters = [] {
+    constexpr std::size_t kWithoutWeight =
+        static_cast<std::size_t>(std::count(kWeights.begin(), kWeights.end(), 0));
+    std::array<Counter, kWeights.size() - kWithoutWeight> counters{};
+    std::size_t next = 0;
+    for (std::size_t index = 0; index < kWeights.size(); ++index) {
+        if (kWeights[index] != 0) {
+            counters[next++] = {kCountersStart + index * kCounterLength, kWeights[index]};
+        }
     }
-    return sum;
+    return counters;
+}();
+
+constexpr DataRateNames kNames = {"FLDataSeqNum", "FLDataSent",    "FLDataSeqNum1",
+                                  "FLDataSent1",  "FLDataSeqNum2", "FLDataSent2"};
+
+PropertyList rateSince(const Place& place) {
+    return dataRateSince(kNames, static_cast<std::uint32_t>(place.here.read(kSequence)),
+                         weightedSum(kCounters, place.here), *place.memory->state);
 }
+
+constexpr auto kRateBytes = std::to_array<Extent>(
+    {extentOf(kSequence), {kCountersStart, kWeights.size() * kCounterLength}});
+constexpr Computation kRate{
+    .name = "data rate",
+    .formula = kDataRateFormula,
+    .read = kRateBytes,
+    .compute = rateSince,
+    .counters = kCounters,
+    .isRunning = true,
+};
+
+constexpr auto kFields =
+    std::to_array<Field>({computed("kFLDataRate", kDataRateFormat, kRate,
+                                   "Data rate of the forward link since the report before.")});
 
 } // namespace
 
-void parseForwardDataRate(const LogRecord& packet, Dictionary& state, const Dictionary& lookup) {
-    if (!packet.has(kMinimumLength)) {
-        systemLog(LogPriority::Error,
-                  "Log code 0x1192 is %d bytes long but must be at least %ld bytes.",
-                  packet.length(), kMinimumLength);
-        return;
-    }
-    updateDataRate(kNames, packet.u32(kSequence), totalOf(packet), state, lookup);
-}
-
-CodeDescription describeForwardDataRate(LogCode logCode) {
-    std::vector<Counter> counters;
-    for (std::size_t counter = 0; counter < kWeights.size(); ++counter) {
-        if (kWeights[counter] != 0) {
-            counters.push_back({kCounters + counter * kCounterLength, kWeights[counter]});
-        }
-    }
-    CodeDescription code{logCode, kMinimumLength};
-    code.fields = {describeDataRate(kNames, u32At(kSequence),
-                                    {kCounters, kWeights.size() * kCounterLength},
-                                    std::move(counters))};
-    return code;
-}
+constexpr CodeLayout kForwardDataRate{
+    .logCode = 0x1192,
+    .name = "Counters of the EV-DO forward link",
+    .minimumLength = kMinimumLength,
+    .fields = kFields,
+    .accepts = hasLength,
+};
 
 } // namespace pallax

@@ -1,12 +1,8 @@
 #pragma once
 
-#include "LogGenerator/Records/LogCode.h"
-#include "LogGenerator/Records/LogRecord.h"
-#include "plist/PropertyList.h"
+#include "LogGenerator/Records/Layout.h"
 
 namespace pallax {
-
-struct CodeDescription;
 
 /// The state of the 1x device, its receivers and its active set.
 ///
@@ -39,9 +35,6 @@ struct CodeDescription;
 /// The list ends before the first pilot that reaches past the packet. Outside Traffic the frame
 /// error rate of the call that has ended is shown once more, as old ("k1xTrafficFER"), and
 /// forgotten.
-void parseOneXStatus(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
-
-/// What that reads and shows, under the log code `logCode`.
-CodeDescription describeOneXStatus(LogCode logCode);
+extern const CodeLayout kOneXStatus;
 
 } // namespace pallax

@@ -1,87 +1,55 @@
 #include "LogGenerator/C2K/OneXSystemIdentity.h"
 
-#include "LogGenerator/C2K/C2KDescription.h"
-#include "LogGenerator/C2K/C2KFormats.h"
 #include "LogGenerator/C2K/C2KLabels.h"
-#include "LogGenerator/C2K/C2KLookup.h"
+#include "LogGenerator/C2K/PacketLength.h"
 #include "platform/SystemLog.h"
+
+#include <array>
 
 namespace pallax {
 
 namespace {
 
-constexpr std::size_t kMinimumLength = 171;
-constexpr std::uint8_t kLeastVersion = 2;
-
-constexpr std::size_t kVersion = 13;
-constexpr std::size_t kRoamingIndicator = 42;
-constexpr std::size_t kSystemType = 46;
-constexpr Position kSystemId = u16At(50);
-constexpr Position kNetworkId = u16At(52);
-constexpr Position kPacketZoneId = u8At(131);
-constexpr Position kProtocolRevision = u8At(133);
-constexpr Position kBaseId = u16At(184);
-
+constexpr Position kVersion = u8At(13);
+constexpr Condition kIsKnownVersion{kVersion, 2, UINT8_MAX};
 /// The system type whose identity the packet carries.
-constexpr std::uint32_t kKnownSystemType = 2;
-constexpr std::string_view kUnknownSystemType = "(unknown system type %d)";
+constexpr Condition kIsKnownSystem{u32At(46), 2, 2, "(unknown system type %d)"};
+
+constexpr auto kFields = std::to_array<Field>({
+    {"k1xRoamingHome", u32At(42), kRoamingIndicators, "Enhanced roaming indicator."},
+    Field{"kSystemId", u16At(50), Conversion::number(), "System identification (SID)."}.when(
+        kIsKnownSystem),
+    Field{"kNetworkId", u16At(52), Conversion::number(), "Network identification (NID)."}.when(
+        kIsKnownSystem),
+    {"kPacketZoneId", u8At(131), Conversion::number(),
+     "Packet zone, whose change makes the phone set up packet data anew."},
+    {"kBaseId", u16At(184), Conversion::number(), "Identity of the base station."},
+    {"kProtocolRevision", u8At(133), Conversion::number(),
+     "Protocol revision of the base station."},
+});
+
+bool isOfKnownVersion(const CodeLayout& code, const LogRecord& packet) {
+    if (!hasLength(code, packet)) {
+        return false;
+    }
+    const bool isKnown = code.condition->holdsIn(packet);
+    if (!isKnown) {
+        systemLog(LogPriority::Error,
+                  "Log code 0x134f has version=%d; only version 2 or higher expected; dropping.",
+                  packet.read(kVersion));
+    }
+    return isKnown;
+}
 
 } // namespace
 
-void parseOneXSystemIdentity(const LogRecord& packet, Dictionary& /*state*/,
-                             const Dictionary& lookup) {
-    if (!packet.has(kMinimumLength)) {
-        systemLog(LogPriority::Error,
-                  "Log code 0x134f is %d bytes long but must be at least %lu bytes.",
-                  packet.length(), kMinimumLength);
-        return;
-    }
-    if (const std::uint8_t version = packet.u8(kVersion); version < kLeastVersion) {
-        systemLog(LogPriority::Error,
-                  "Log code 0x134f has version=%d; only version 2 or higher expected; dropping.",
-                  version);
-        return;
-    }
-    const std::uint32_t systemType = packet.u32(kSystemType);
-    const auto number = [&packet](const Position& position) -> PropertyList {
-        return DisplayNumber(packet.read(position), kDecimal);
-    };
-    const auto ofKnownSystem = [&](const Position& position) -> PropertyList {
-        // A text, for the number in it is not that of the row.
-        return systemType == kKnownSystemType ? number(position)
-                                              : formatText(kUnknownSystemType, {systemType});
-    };
-    setLookupValue("k1xRoamingHome", kRoamingIndicators.valueOf(packet.u32(kRoamingIndicator)),
-                   lookup);
-    setLookupValue("kSystemId", ofKnownSystem(kSystemId), lookup);
-    setLookupValue("kNetworkId", ofKnownSystem(kNetworkId), lookup);
-    setLookupValue("kPacketZoneId", number(kPacketZoneId), lookup);
-    setLookupValue("kBaseId", number(kBaseId), lookup);
-    setLookupValue("kProtocolRevision", number(kProtocolRevision), lookup);
-}
-
-bool isWholeOneXSystemIdentity(const LogRecord& packet) {
-    return packet.has(kMinimumLength) && packet.u8(kVersion) >= kLeastVersion;
-}
-
-CodeDescription describeOneXSystemIdentity(LogCode logCode) {
-    constexpr std::int64_t kLargestVersion = UINT8_MAX;
-    const auto ofKnownSystem = [](FieldDescription field) {
-        field.condition =
-            Condition{u32At(kSystemType), kKnownSystemType, kKnownSystemType, kUnknownSystemType};
-        return field;
-    };
-    CodeDescription code{logCode, kMinimumLength};
-    code.condition = Condition{u8At(kVersion), kLeastVersion, kLargestVersion};
-    code.fields = {
-        describeLabel("k1xRoamingHome", u32At(kRoamingIndicator), kRoamingIndicators),
-        ofKnownSystem(describeNumber("kSystemId", kSystemId, kDecimal)),
-        ofKnownSystem(describeNumber("kNetworkId", kNetworkId, kDecimal)),
-        describeNumber("kPacketZoneId", kPacketZoneId, kDecimal),
-        describeNumber("kBaseId", kBaseId, kDecimal),
-        describeNumber("kProtocolRevision", kProtocolRevision, kDecimal),
-    };
-    return code;
-}
+constexpr CodeLayout kOneXSystemIdentity{
+    .logCode = 0x134F,
+    .name = "Identity of the 1x system",
+    .minimumLength = 171,
+    .condition = &kIsKnownVersion,
+    .fields = kFields,
+    .accepts = isOfKnownVersion,
+};
 
 } // namespace pallax

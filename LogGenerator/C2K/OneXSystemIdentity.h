@@ -1,12 +1,8 @@
 #pragma once
 
-#include "LogGenerator/Records/LogCode.h"
-#include "LogGenerator/Records/LogRecord.h"
-#include "plist/PropertyList.h"
+#include "LogGenerator/Records/Layout.h"
 
 namespace pallax {
-
-struct CodeDescription;
 
 /// Which 1x system serves the phone.
 ///
@@ -20,13 +16,6 @@ struct CodeDescription;
 ///   131   8      kPacketZoneId       number
 ///   133   8      kProtocolRevision   number
 ///   184   16     kBaseId             number; past the end of a shorter packet, so 0
-void parseOneXSystemIdentity(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
-
-/// Whether `parseOneXSystemIdentity` accepts the packet; it then sets every value that it ever
-/// sets, and logs nothing.
-bool isWholeOneXSystemIdentity(const LogRecord& packet);
-
-/// What that reads and shows, under the log code `logCode`.
-CodeDescription describeOneXSystemIdentity(LogCode logCode);
+extern const CodeLayout kOneXSystemIdentity;
 
 } // namespace pallax

@@ -1,12 +1,8 @@
 #pragma once
 
-#include "LogGenerator/Records/LogCode.h"
-#include "LogGenerator/Records/LogRecord.h"
-#include "plist/PropertyList.h"
+#include "LogGenerator/Records/Layout.h"
 
 namespace pallax {
-
-struct CodeDescription;
 
 /// Whether a frame of the 1x traffic channel was in error; the rate of such frames is averaged.
 ///
@@ -14,9 +10,6 @@ struct CodeDescription;
 ///   byte  width  lookup name     shown as
 ///   11: traffic demodulation
 ///   24    8      k1xTrafficFER   an error unless 0: the average, in per cent
-void parseOneXTrafficErrors(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
-
-/// What that reads and shows, under the log code `logCode`.
-CodeDescription describeOneXTrafficErrors(LogCode logCode);
+extern const CodeLayout kOneXTrafficErrors;
 
 } // namespace pallax

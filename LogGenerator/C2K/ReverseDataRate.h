@@ -1,12 +1,8 @@
 #pragma once
 
-#include "LogGenerator/Records/LogCode.h"
-#include "LogGenerator/Records/LogRecord.h"
-#include "plist/PropertyList.h"
+#include "LogGenerator/Records/Layout.h"
 
 namespace pallax {
-
-struct CodeDescription;
 
 /// How much the EV-DO reverse link has carried: counters by rate, each rate with a weight of its
 /// own. Shown as a rate; see DataRate.h.
@@ -21,9 +17,6 @@ struct CodeDescription;
 ///   a block: for each of the twelve rates, 24 bytes apart, two rows of four counters
 ///   0         4 x 32
 ///   288       4 x 32
-void parseReverseDataRate(const LogRecord& packet, Dictionary& state, const Dictionary& lookup);
-
-/// What that reads and shows, under the log code `logCode`.
-CodeDescription describeReverseDataRate(LogCode logCode);
+extern const CodeLayout kReverseDataRate;
 
 } // namespace pallax

@@ -5,8 +5,6 @@ namespace pallax {
 namespace {
 
 constexpr std::string_view kStateKey = "TrafficFER";
-constexpr NumberFormat kPercent{"%.02f%%"};
-constexpr NumberFormat kOldPercent{"%.02f%% (old)", "%"};
 
 float percent(float rate) {
     constexpr float kPerCent = 100.0F;
@@ -45,24 +43,11 @@ void endTrafficFER(Dictionary& state) {
 }
 
 PropertyList shownTrafficFER(float rate) {
-    return DisplayNumber(double{percent(rate)}, kPercent);
+    return DisplayNumber(double{percent(rate)}, kTrafficFERFormat);
 }
 
 PropertyList shownOldTrafficFER(float rate) {
-    return DisplayNumber(double{percent(rate)}, kOldPercent);
-}
-
-FieldDescription describeTrafficFER(std::size_t frameInError) {
-    return describeComputed(kTrafficFERName, kPercent, "frame errors",
-                            "a frame is in error unless the byte is 0; of the call's frames so far "
-                            "the average in which the newest has a weight of 1/64",
-                            {{frameInError}});
-}
-
-FieldDescription describeOldTrafficFER(std::size_t deviceState) {
-    return describeComputed(kTrafficFERName, kOldPercent, "old frame errors",
-                            "outside Traffic, once: the average of the call that is over",
-                            {{deviceState}});
+    return DisplayNumber(double{percent(rate)}, kOldTrafficFERFormat);
 }
 
 } // namespace pallax

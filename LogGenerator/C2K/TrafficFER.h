@@ -1,17 +1,19 @@
 #pragma once
 
-#include "LogGenerator/Records/Description.h"
 #include "plist/PropertyList.h"
 
 #include <optional>
+#include <string_view>
 
 namespace pallax {
 
 /// The frame error rate of the 1x traffic channel, an exponential average between 0 and 1 that
 /// lives in the state under "TrafficFER" for as long as a call. Single precision throughout.
 
-/// The lookup name under which it is shown.
+/// The lookup name under which it is shown, and how: in per cent.
 inline constexpr std::string_view kTrafficFERName = "k1xTrafficFER";
+inline constexpr NumberFormat kTrafficFERFormat{"%.02f%%"};
+inline constexpr NumberFormat kOldTrafficFERFormat{"%.02f%% (old)", "%"};
 
 /// The rate so far; nothing when no call has reported a frame yet.
 std::optional<float> trafficFER(const Dictionary& state);
@@ -22,14 +24,9 @@ float addTrafficFrame(bool inError, Dictionary& state);
 /// Forgets the rate, so that the next call starts anew.
 void endTrafficFER(Dictionary& state);
 
-/// A rate as shown: in per cent.
+/// A rate as shown.
 PropertyList shownTrafficFER(float rate);
 /// The same, of a call that is over.
 PropertyList shownOldTrafficFER(float rate);
-
-/// The rate that is shown where the byte at `frameInError` tells of a frame: an error unless 0.
-FieldDescription describeTrafficFER(std::size_t frameInError);
-/// The rate of a call that is over, as the device state at that byte tells.
-FieldDescription describeOldTrafficFER(std::size_t deviceState);
 
 } // namespace pallax

@@ -5,7 +5,7 @@
 
 namespace pallax::doubles {
 
-/// Every name that some parser of CDMA fills.
+/// Every name that some layout of CDMA fills.
 inline const std::vector<std::string> kLookupNames = {
     "kChannel",
     "kBandClass",

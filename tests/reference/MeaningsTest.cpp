@@ -116,10 +116,14 @@ TEST(Meanings, TheLayoutsOfASectionSayOneOfEachKey) {
 
 TEST(Meanings, TheLayoutsOfATechnologyNameALogCodeOnce) {
     for (const TechnologyReference& technology : doubles::reference()) {
-        std::set<LogCode> named;
+        std::map<LogCode, const char*> named; // a layout of CDMA may fill several sections
         for (const SectionReference& section : technology.sections) {
             for (const CodeDescription& code : section.codes) {
-                EXPECT_TRUE(code.name.empty() || named.insert(code.logCode).second) << code.name;
+                if (!code.name.empty()) {
+                    const auto first = named.emplace(code.logCode, code.name.data()).first;
+                    EXPECT_EQ(static_cast<const void*>(first->second), code.name.data())
+                        << code.name;
+                }
             }
         }
     }

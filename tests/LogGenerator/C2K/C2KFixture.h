@@ -36,7 +36,7 @@ public:
         (void)_log.take();
     }
 
-    /// Feeds a packet without prefix. Kept are the lines that its parser logs, without the two that
+    /// Feeds a packet without prefix. Kept are the lines that reading it logs, without the two that
     /// the framing logs for every such packet.
     void feed(const ByteBuffer& bytes) {
         generator.updateState(state, bytes);
@@ -90,7 +90,7 @@ private:
 public:
     C2KLogGenerator generator{_fixture.environment()};
     Dictionary state;
-    std::vector<RecordingLog::Line> lines; ///< what the last packet's parser logged
+    std::vector<RecordingLog::Line> lines; ///< what reading the last packet logged
 };
 
 /// "(name: value, name: value)": a list by pilot as the display tree shows it; "(no list)" where

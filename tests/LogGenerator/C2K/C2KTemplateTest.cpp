@@ -110,7 +110,7 @@ TEST(C2KTemplate, TheDeliveredOneShowsEveryLookupNameAndNoOther) {
     for (const std::string& name : kLookupNames) {
         EXPECT_GE(counts[name], 1) << name;
     }
-    EXPECT_EQ(counts.size(), kLookupNames.size()) << "what no parser fills would stay empty";
+    EXPECT_EQ(counts.size(), kLookupNames.size()) << "what no layout fills would stay empty";
 }
 
 TEST(C2KTemplate, TheDeliveredOneGroupsItsRows) {

@@ -1,6 +1,5 @@
 #include "LogGenerator/C2K/DataRate.h"
 
-#include "LogGenerator/C2K/C2KLookup.h"
 #include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
@@ -8,31 +7,26 @@
 namespace pallax {
 namespace {
 
-constexpr DataRateNames kNames = {"kRate", "Seq", "Sent", "Seq1", "Sent1", "Seq2", "Sent2"};
-constexpr const char* kBefore = "what was shown before";
+constexpr DataRateNames kNames = {"Seq", "Sent", "Seq1", "Sent1", "Seq2", "Sent2"};
+constexpr const char* kUnchanged = "what was shown before";
 
 /// The rate that is shown of one link, and what is kept of it.
 class DataRateTest : public testing::Test {
 protected:
-    DataRateTest() {
-        addLookupPlace("kRate", "Rate", _display, _lookup);
-        _state.set("ExtraInfo", _extraInfo);
-    }
+    DataRateTest() { _state.set("ExtraInfo", _extraInfo); }
 
     /// The row behind a packet: "what was shown before" where the packet leaves it alone.
     std::string after(std::uint32_t sequence, std::int64_t sent) {
-        _display->set("Rate", kBefore);
-        updateDataRate(kNames, sequence, sent, _state, _lookup);
-        return _display->find("Rate")->string().value_or("(no text)");
+        _rate = dataRateSince(kNames, sequence, sent, _state);
+        return _rate.isNull() ? kUnchanged : _rate.string().value_or("(no text)");
     }
     Dictionary kept() const {
         return {{"Seq", *_state.find("Seq")}, {"Sent", *_state.find("Sent")}};
     }
     static PropertyList number(std::int64_t value) { return PropertyList::integer(value); }
 
-    DictionaryRef _display = std::make_shared<Dictionary>();
+    PropertyList _rate; ///< null where the row stays as it is
     DictionaryRef _extraInfo = std::make_shared<Dictionary>();
-    Dictionary _lookup;
     Dictionary _state;
 };
 
@@ -50,7 +44,7 @@ TEST_F(DataRateTest, TheNextShowsWhatWasSentOver1024TimesTheSequenceNumbers) {
     EXPECT_EQ(after(12, 4096 + 2048 + 1024), "0.25 kbps");
     EXPECT_EQ(after(13, 4096 + 2048 + 1024 + 128), "0.12 kbps") << "an even 0.125";
     EXPECT_EQ(after(14, 4096 + 2048 + 1024 + 128), "0.00 kbps") << "nothing was sent";
-    EXPECT_EQ(_display->find("Rate")->displayNumber()->unit(), "kbps");
+    EXPECT_EQ(_rate.displayNumber()->unit(), "kbps");
 }
 
 TEST_F(DataRateTest, BothPairsAreCopiedIntoTheExtraInformation) {
@@ -64,7 +58,7 @@ TEST_F(DataRateTest, BothPairsAreCopiedIntoTheExtraInformation) {
 
 TEST_F(DataRateTest, TheSameSequenceNumberLeavesTheRateButUpdatesWhatIsKept) {
     (void)after(7, 4096);
-    EXPECT_EQ(after(7, 9999), kBefore);
+    EXPECT_EQ(after(7, 9999), kUnchanged);
     EXPECT_EQ(PropertyList(kept()),
               PropertyList(Dictionary{{"Seq", number(7)}, {"Sent", number(9999)}}));
     EXPECT_EQ(*_extraInfo->find("Sent2"), number(4096)) << "in any case";
@@ -72,7 +66,7 @@ TEST_F(DataRateTest, TheSameSequenceNumberLeavesTheRateButUpdatesWhatIsKept) {
 
 TEST_F(DataRateTest, ASequenceNumberThatFellLeavesTheRateButUpdatesWhatIsKept) {
     (void)after(7, 4096);
-    EXPECT_EQ(after(6, 9999), kBefore);
+    EXPECT_EQ(after(6, 9999), kUnchanged);
     EXPECT_EQ(PropertyList(kept()),
               PropertyList(Dictionary{{"Seq", number(6)}, {"Sent", number(9999)}}));
 }
@@ -80,9 +74,9 @@ TEST_F(DataRateTest, ASequenceNumberThatFellLeavesTheRateButUpdatesWhatIsKept) {
 TEST_F(DataRateTest, TheDifferenceIsSigned32BitsWideAcrossTheWrap) {
     (void)after(0xFFFFFFFF, 0);
     EXPECT_EQ(after(0, 1024), "1.00 kbps");
-    EXPECT_EQ(after(0xFFFFFFFF, 2048), kBefore) << "one step back";
+    EXPECT_EQ(after(0xFFFFFFFF, 2048), kUnchanged) << "one step back";
     EXPECT_EQ(after(0x7FFFFFFE, 2048 + 1024), "0.00 kbps") << "2^31 - 1 steps forth";
-    EXPECT_EQ(after(0xFFFFFFFE, 0), kBefore) << "2^31 steps are as many back";
+    EXPECT_EQ(after(0xFFFFFFFE, 0), kUnchanged) << "2^31 steps are as many back";
     EXPECT_EQ(after(0x0000000D, 15 * 1024), "1.00 kbps");
 }
 
@@ -120,15 +114,12 @@ TEST_F(DataRateTest, WithoutExtraInformationTheRateIsShownAllTheSame) {
 
 TEST_F(DataRateTest, TheRateIsTheDifferenceOfTotalsOverThatOfSequenceNumbers) {
     EXPECT_TRUE(rc::check([](std::uint32_t first, std::uint32_t second) {
-        Dictionary lookup;
-        const auto display = std::make_shared<Dictionary>();
-        addLookupPlace("kRate", "Rate", display, lookup);
         Dictionary state;
         const std::int64_t sent = *rc::gen::inRange<std::int64_t>(0, 1LL << 48U);
         const std::int64_t later = *rc::gen::inRange<std::int64_t>(0, 1LL << 48U);
-        updateDataRate(kNames, first, sent, state, lookup);
-        updateDataRate(kNames, second, later, state, lookup);
-        const DisplayNumber* shown = display->find("Rate")->displayNumber();
+        (void)dataRateSince(kNames, first, sent, state);
+        const PropertyList rate = dataRateSince(kNames, second, later, state);
+        const DisplayNumber* shown = rate.displayNumber();
         const std::uint32_t steps = second - first;
         RC_ASSERT((shown != nullptr) == (steps >= 1 && steps <= 0x7FFFFFFF));
         if (shown != nullptr) {

@@ -23,7 +23,7 @@ struct Twin {
     Dictionary state;
 };
 
-/// A packet of any of the codes, which its parser mostly accepts.
+/// A packet of any of the codes, which its layout mostly accepts.
 ByteBuffer anyPacketOfAnyCode() {
     switch (any::between(0, 8)) {
     case 0: {

@@ -1,0 +1,60 @@
+#pragma once
+
+#include "LogGenerator/Records/Sample.h"
+#include "plist/PropertyList.h"
+
+#include <span>
+#include <string>
+#include <vector>
+
+namespace pallax {
+
+/// The display sink of CDMA: stores each value in every place that the lookup table has for its
+/// name. A list by pilot becomes a dictionary that is shown sorted, whose key "INDEX;PN" gives each
+/// entry its place by the index (as text: 10 comes before 2) and its name, the pilot's PN offset.
+///
+/// Between two looks at the display a modem sends many packets of one code, each of which replaces
+/// all that the one before has shown. Such a packet is kept, and read when the display is looked
+/// at; the layout tells which may be.
+class LookupDisplay final : public SampleSink {
+public:
+    static constexpr bool kTakesHidden = false;
+
+    /// The layouts live as long as the program.
+    explicit LookupDisplay(std::span<const CodeLayout* const> codes);
+
+    /// Takes an accepted packet of the code that is the `index`th. Without a lookup table (null) no
+    /// value has a place.
+    void take(std::size_t index, const LogRecord& packet, const DictionaryRef& lookup,
+              Dictionary& state);
+    /// Reads the packets that are kept.
+    void bringUpToDate();
+
+    void sample(const Sample& sample) override;
+    void keyRemoved(std::string_view /*key*/) override {} // a value stays until the next
+    void beginList(const SampleList& list) override;
+    void endList() override;
+    void beginEntry(std::size_t index, std::int64_t name) override;
+    void endEntry() override {}
+
+private:
+    struct Code {
+        const CodeLayout* layout;
+        bool isReadLate;
+        // The latest packet that waits, and the table for it; null: none.
+        DictionaryRef lookup = nullptr;
+        ByteBuffer packet = {};
+    };
+
+    void read(const CodeLayout& code, const LogRecord& packet, const Dictionary* lookup,
+              Dictionary* state);
+
+    std::vector<Code> _codes;
+    RecordMemory _memory;
+    const Dictionary* _lookup = nullptr; ///< while a packet is read; null without one
+    DictionaryRef _pilots;               ///< of the list that has begun and not ended
+    const ListLayout* _list = nullptr;
+    std::string _pilot; ///< the key of its entry
+};
+
+} // namespace pallax
