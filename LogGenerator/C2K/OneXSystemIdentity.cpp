@@ -22,7 +22,7 @@ constexpr auto kFields = std::to_array<Field>({
     Field{"kNetworkId", u16At(52), Conversion::number(), "Network identification (NID)."}.when(
         kIsKnownSystem),
     {"kPacketZoneId", u8At(131), Conversion::number(),
-     "Packet zone, whose change makes the phone set up packet data anew."},
+     "Packet zone; when it changes, the phone sets up packet data again."},
     {"kBaseId", u16At(184), Conversion::number(), "Identity of the base station."},
     {"kProtocolRevision", u8At(133), Conversion::number(),
      "Protocol revision of the base station."},

@@ -13,7 +13,7 @@ constexpr auto kFields = std::to_array<Field>({
           "Identity of the coded composite transport channel."}
         .identifying(),
     {"TSNUM", u8At(1), Conversion::number(),
-     "Number of time slots, or of the time slot: the record gives no more than the name."},
+     "Number of time slots, or of the time slot: the record gives only the name."},
 });
 
 constexpr auto kRatio = std::to_array<Field>({{"", u8At(0), Conversion::number()}});

@@ -10,7 +10,7 @@ constexpr auto kFields = std::to_array<Field>({
     {"Cell ID", bitsAt(0, 0, 14), Conversion::number(),
      "Number of the neighbour in the record, 14 bits."},
     Field{"Band Indicator", bitsAt(1, 6, 1), Conversion::number(),
-          "Which of the bands with the same channel numbers the ARFCN is of."}
+          "Band of the ARFCN, where bands share channel numbers."}
         .identifying(),
     {"BSIC Valid", bitsAt(1, 7, 1), Conversion::number(),
      "Whether the base station identity code has been read."},
@@ -41,8 +41,7 @@ constexpr RecordLayout kLayout{
     .section = "GSM Neighbor Cell List",
     .logLine = "GSM Neighbor Cell List",
     .kind = SectionKind::List,
-    .meaning = "The neighbours of GSM; they are read and kept from the display, so that the list "
-               "stays empty.",
+    .meaning = "The GSM neighbours; they are read but not displayed, so the list stays empty.",
     .codes = kCodes,
     .reportsOtherCodes = false,
 };

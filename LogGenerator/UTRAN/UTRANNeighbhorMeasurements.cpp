@@ -18,8 +18,7 @@ constexpr auto kFields = std::to_array<Field>({
     Field{"UARFCN", bitsAt(0, 0, 14), Conversion::number(), "UARFCN of the neighbour."}
         .identifying(),
     Field{"Cell ID", bitsAt(1, 6, 7), Conversion::number(),
-          "Identity by which the modem tells the neighbour, 7 bits; not the network's cell "
-          "identity."}
+          "Identity of the neighbour for the modem, 7 bits; not the network's cell identity."}
         .identifying(),
     {"Filter RSCP", bitsAt(2, 5, 8), Conversion::number(kSixDecimals, kRscpStep),
      "Received signal code power after the filter, as the modem counts it; its unit is not "
@@ -28,7 +27,7 @@ constexpr auto kFields = std::to_array<Field>({
           "Set that the cell belongs to: active (ASET), monitored (MSET) or detected (DSET)."}
         .when(kHasStatus),
     {"inJDCS", bitsAt(3, 7, 1), Conversion::flag("TRUE", "FALSE"),
-     "Whether the cell is in the JDCS; the record gives no more than the name."},
+     "Whether the cell is in the JDCS; the record gives only the name."},
 });
 
 constexpr auto kLists = std::to_array<ListLayout>({{
@@ -48,7 +47,7 @@ constexpr RecordLayout kLayout{
     .section = "Neighbor Cell List",
     .logLine = "NeighbhorMeasurements List",
     .kind = SectionKind::List,
-    .meaning = "The neighbours of UTRAN.",
+    .meaning = "The UTRAN neighbours.",
     .codes = kCodes,
     .reportsOtherCodes = false,
 };

@@ -15,7 +15,7 @@ constexpr std::string_view kUplinkKey = "Uplink UARFCN";
 
 constexpr auto kFields = std::to_array<Field>({
     {"Cell Access Restrictions", u8At(14), Conversion::number(),
-     "Access restrictions of the cell, as one number; no meaning of the single values is known."},
+     "Access restrictions of the cell, as one number; the meaning of the values is not known."},
     {kCellIdKey, s32At(21), Conversion::number(), "Identity of the serving cell."},
     {kDownlinkKey, u16At(19), Conversion::number(), "UARFCN of the downlink carrier."},
     {kUplinkKey, u16At(17), Conversion::number(), "UARFCN of the uplink carrier."},
