@@ -43,7 +43,7 @@ std::string itemOf(const ReferenceRow& row) {
     return text + roffText(row.meaning) + (row.meaning.empty() ? "" : "\n");
 }
 
-std::string tableOf(const ReferenceTable& table) {
+std::string roffTable(const ReferenceTable& table) {
     std::string text;
     if (!table.heading.empty()) {
         text += ".PP\n\\fI" + roffText(table.heading) + "\\fR.\n";
@@ -55,7 +55,7 @@ std::string tableOf(const ReferenceTable& table) {
     return text;
 }
 
-std::string sectionOf(const TechnologyReference& technology, const SectionReference& section) {
+std::string roffSection(const TechnologyReference& technology, const SectionReference& section) {
     std::string text = ".SS " + roffText(std::string(technology.title) + ": " + section.name) +
                        "\n" + roffText(technology.meaningOf(section.name, "")) +
                        (section.isList ? "\nA list.\n" : "\n");
@@ -63,10 +63,10 @@ std::string sectionOf(const TechnologyReference& technology, const SectionRefere
         const CodeText words = textOf(technology, section, code);
         text += ".PP\n" + roffBold(words.title) + ".\n" + roffText(words.demands) + "\n";
         for (const ReferenceTable& table : words.tables) {
-            text += tableOf(table);
+            text += roffTable(table);
         }
     }
-    return text + tableOf(objectTable(technology, section));
+    return text + roffTable(objectTable(technology, section));
 }
 
 std::string headingOf(const TechnologyReference& technology) {
@@ -92,7 +92,7 @@ std::string sectionsPage(std::span<const TechnologyReference> technologies) {
                 "it.\n";
         }
         for (const SectionReference& section : technology.sections) {
-            text += sectionOf(technology, section);
+            text += roffSection(technology, section);
         }
     }
     return text + ".SH SEE ALSO\n.BR pallax (1),\n.BR pallax\\-decode (1),\n"
