@@ -1,12 +1,10 @@
-#include "plist/BinaryPropertyListFormat.h"
+#include "plist/BinaryObjects.h"
 #include "plist/PropertyListCodec.h"
 #include "plist/Refusal.h"
 #include "text/Utf8.h"
 
 #include <algorithm>
-#include <array>
 #include <bit>
-#include <limits>
 #include <unordered_map>
 
 namespace pallax {
@@ -15,48 +13,11 @@ namespace {
 
 using namespace binary_form;
 
-void appendNumber(std::string& out, std::uint64_t number, std::size_t width) {
-    for (std::size_t byte = width; byte > 0; --byte) {
-        out += static_cast<char>((number >> (8 * (byte - 1))) & 0xFFU);
-    }
-}
-
-std::size_t powerOfWidth(std::uint64_t number) {
-    if (number <= std::numeric_limits<std::uint8_t>::max()) {
-        return 0;
-    }
-    if (number <= std::numeric_limits<std::uint16_t>::max()) {
-        return 1;
-    }
-    return number <= std::numeric_limits<std::uint32_t>::max() ? 2 : 3;
-}
-
-void appendMarker(std::string& out, Kind kind, std::uint64_t low) {
-    appendNumber(out, (std::uint64_t{kind} << 4U) | low, 1);
-}
-
-/// In 1, 2 or 4 bytes when it fits unsigned, else in 8.
-void appendInteger(std::string& out, std::int64_t number) {
-    const auto bits = std::bit_cast<std::uint64_t>(number);
-    const std::size_t power = powerOfWidth(bits);
-    appendMarker(out, kInteger, power);
-    appendNumber(out, bits, std::size_t{1} << power);
-}
-
 /// In 16 bytes, for 8 would be read as a negative number.
 void appendLargeInteger(std::string& out, std::uint64_t number) {
     appendMarker(out, kInteger, kSixteenBytes);
     appendNumber(out, 0, kWidestNumber);
     appendNumber(out, number, kWidestNumber);
-}
-
-void appendCounted(std::string& out, Kind kind, std::size_t count) {
-    if (count < kCountFollows) {
-        appendMarker(out, kind, count);
-    } else {
-        appendMarker(out, kind, kCountFollows);
-        appendInteger(out, static_cast<std::int64_t>(count));
-    }
 }
 
 void appendUtf16(std::string& out, char32_t codePoint) {
@@ -222,39 +183,25 @@ void BinaryWriter::addEntries(const Dictionary& dictionary, std::size_t depth,
 
 ByteBuffer BinaryWriter::assemble() const {
     const std::size_t referenceWidth = std::size_t{1} << powerOfWidth(_objects.size() - 1);
-    std::string out;
-    out.append(kSignature).append(kVersion);
-    std::vector<std::size_t> offsets;
-    offsets.reserve(_objects.size());
+    Objects objects;
     for (const Object& object : _objects) {
-        offsets.push_back(out.size());
         if (object.scalar != nullptr) {
-            out += *object.scalar;
+            objects.add(*object.scalar);
             continue;
         }
         const std::size_t perElement = object.kind == kDictionary ? 2 : 1;
-        appendCounted(out, object.kind, object.references.size() / perElement);
+        std::string references;
         for (const std::uint32_t reference : object.references) {
-            appendNumber(out, reference, referenceWidth);
+            appendNumber(references, reference, referenceWidth);
         }
+        objects.add(object.kind, object.references.size() / perElement, {references});
     }
-    const std::size_t table = out.size();
-    const std::size_t offsetWidth = std::size_t{1} << powerOfWidth(table);
-    for (const std::size_t offset : offsets) {
-        appendNumber(out, offset, offsetWidth);
-    }
-    out.append(kUnusedInTrailer, '\0');
-    appendNumber(out, offsetWidth, 1);
-    appendNumber(out, referenceWidth, 1);
-    constexpr std::uint64_t kRoot = 0;
-    for (const std::uint64_t number :
-         {std::uint64_t{_objects.size()}, kRoot, std::uint64_t{table}}) {
-        appendNumber(out, number, kWidestNumber);
-    }
-    if (out.size() > kLargestPropertyList) {
+    constexpr std::size_t kRoot = 0;
+    const std::string_view list = objects.finish(kRoot, referenceWidth);
+    if (list.size() > kLargestPropertyList) {
         refuse(0, "a property list larger than 64 MiB");
     }
-    return {out.begin(), out.end()};
+    return {list.begin(), list.end()};
 }
 
 } // namespace

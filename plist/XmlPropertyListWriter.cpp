@@ -1,10 +1,8 @@
 #include "plist/PropertyListCodec.h"
 #include "plist/Refusal.h"
-#include "plist/XmlMarkupCheck.h"
+#include "plist/XmlStream.h"
 #include "text/Base64.h"
-#include "text/Utf8.h"
 
-#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cmath>
@@ -12,53 +10,6 @@
 namespace pallax {
 
 namespace {
-
-constexpr std::string_view kOpening = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
-                                      "<plist version=\"1.0\">\n";
-constexpr std::string_view kClosing = "</plist>\n";
-
-/// Stands in XML as it is, whatever comes before and after it.
-bool needsNoEscape(char letter) {
-    return letter >= ' ' && letter <= '~' && letter != '&' && letter != '<' && letter != '>';
-}
-
-void appendEscaped(std::string& out, std::string_view text) {
-    for (std::size_t at = 0; at < text.size();) {
-        const auto rest = text.substr(at);
-        const auto plain = static_cast<std::size_t>(
-            std::find_if_not(rest.begin(), rest.end(), needsNoEscape) - rest.begin());
-        if (plain > 0) {
-            out += rest.substr(0, plain);
-            at += plain;
-            continue;
-        }
-        const Utf8CodePoint next = utf8At(text, at);
-        if (next.size == 0) {
-            refuse(0, "a text that is no UTF-8");
-        }
-        if (!isXmlCharacter(next.value)) {
-            refuse(0, "a text with a control character that XML cannot hold");
-        }
-        switch (next.value) {
-        case '&':
-            out += "&amp;";
-            break;
-        case '<':
-            out += "&lt;";
-            break;
-        case '>':
-            out += "&gt;";
-            break;
-        case '\r': // as it stands, a reader would take it for a line end and make it an LF
-            out += "&#13;";
-            break;
-        default:
-            out += text.substr(at, next.size);
-            break;
-        }
-        at += next.size;
-    }
-}
 
 /// The shortest text that reads back as the same value.
 std::string realText(double number) {
@@ -74,125 +25,79 @@ std::string realText(double number) {
     return {digits.data(), end};
 }
 
-class XmlWriter {
-public:
-    std::string write(const PropertyList& object) {
-        _out += kOpening;
-        value(object, 1);
-        _out += kClosing;
-        return std::move(_out);
-    }
-
-private:
-    void value(const PropertyList& object, std::size_t depth);
-    void scalar(const PropertyList& object);
-    void date(Date date);
-    void array(const Array& array, std::size_t depth);
-    void dictionary(const Dictionary& dictionary, std::size_t depth);
-
-    void element(std::string_view name, std::string_view text);
-    void textElement(std::string_view name, std::string_view text);
-    void indent(std::size_t depth) { _out.append(depth - 1, '\t'); }
-
-    std::string _out;
-};
-
-void XmlWriter::element(std::string_view name, std::string_view text) {
-    _out.append("<").append(name).append(">").append(text);
-    _out.append("</").append(name).append(">\n");
-}
-
-void XmlWriter::textElement(std::string_view name, std::string_view text) {
-    _out.append("<").append(name).append(">");
-    appendEscaped(_out, text);
-    _out.append("</").append(name).append(">\n");
-}
-
-void XmlWriter::value(const PropertyList& object, std::size_t depth) {
-    // What is larger could not be read back; shared containers can make it so.
-    if (_out.size() > kLargestPropertyList - kClosing.size()) {
-        refuse(0, "a property list larger than 64 MiB");
-    }
-    indent(depth);
-    if (const ArrayRef elements = object.array()) {
-        array(*elements, depth);
-    } else if (const DictionaryRef entries = object.dictionary()) {
-        dictionary(*entries, depth);
-    } else {
-        scalar(object);
-    }
-}
-
-void XmlWriter::scalar(const PropertyList& object) {
+void tellScalar(XmlStream& out, const PropertyList& object) {
     if (const auto text = object.string()) {
-        textElement("string", *text);
+        out.text(*text);
     } else if (const auto integer = object.integer()) {
-        element("integer", std::to_string(*integer));
+        out.element("integer", std::to_string(*integer));
     } else if (const auto large = object.largeInteger()) {
-        element("integer", std::to_string(*large));
+        out.element("integer", std::to_string(*large));
     } else if (const auto real = object.real()) {
-        element("real", realText(*real));
+        out.element("real", realText(*real));
     } else if (const auto truth = object.boolean()) {
-        _out += *truth ? "<true/>\n" : "<false/>\n";
+        out.boolean(*truth);
     } else if (const SharedBytes data = object.data()) {
-        element("data", base64Text(*data));
-    } else if (const auto moment = object.date()) {
-        date(*moment);
+        out.element("data", base64Text(*data));
+    } else if (const auto date = object.date()) {
+        const auto moment = isoDateText(*date);
+        if (!moment) {
+            refuse(0, "a date outside the years 0 to 9999");
+        }
+        out.element("date", *moment);
     } else {
         refuse(0, "a null object");
     }
 }
 
-void XmlWriter::date(Date date) {
-    const auto text = isoDateText(date);
-    if (!text) {
-        refuse(0, "a date outside the years 0 to 9999");
-    }
-    element("date", *text);
-}
+void tell(XmlStream& out, const PropertyList& object);
 
-void XmlWriter::array(const Array& array, std::size_t depth) {
-    requireDepth(0, depth);
+void tellArray(XmlStream& out, const Array& array) {
     if (array.empty()) {
-        _out += "<array/>\n";
-        return;
+        return out.emptyArray();
     }
-    _out += "<array>\n";
+    out.beginArray();
     for (const PropertyList& element : array) {
-        value(element, depth + 1);
+        tell(out, element);
     }
-    indent(depth);
-    _out += "</array>\n";
+    out.endArray();
 }
 
-void XmlWriter::dictionary(const Dictionary& dictionary, std::size_t depth) {
-    requireDepth(0, depth);
+void tellDictionary(XmlStream& out, const Dictionary& dictionary) {
     if (dictionary.empty()) {
-        _out += "<dict/>\n";
-        return;
+        return out.emptyDictionary();
     }
-    _out += "<dict>\n";
+    out.beginDictionary();
     for (const Dictionary::Entry& entry : dictionary) {
         if (!entry.hasStringKey) {
             refuse(0, "a key that is no string");
         }
-        indent(depth + 1);
-        textElement("key", entry.key.view());
-        value(entry.value, depth + 1);
+        out.key(entry.key.view());
+        tell(out, entry.value);
     }
-    indent(depth);
-    _out += "</dict>\n";
+    out.endDictionary();
+}
+
+void tell(XmlStream& out, const PropertyList& object) {
+    if (const ArrayRef elements = object.array()) {
+        tellArray(out, *elements);
+    } else if (const DictionaryRef entries = object.dictionary()) {
+        tellDictionary(out, *entries);
+    } else {
+        tellScalar(out, object);
+    }
 }
 
 } // namespace
 
 Result<std::string, CodecError> serializeXml(const PropertyList& object) {
     return refusedOr<std::string>([&]() -> Result<std::string, CodecError> {
-        std::string xml = XmlWriter().write(object);
+        XmlStream stream;
+        tell(stream, object);
+        const std::string_view xml = stream.finish();
         if (xml.size() > kLargestPropertyList) {
             refuse(0, "a property list larger than 64 MiB");
         }
-        return xml;
+        return std::string(xml);
     });
 }
 

@@ -13,7 +13,7 @@ namespace {
 
 using Phase = Activity::Phase;
 
-constexpr double kLevelNoiseDb = 0.6;
+constexpr double kRxLevelNoiseDb = 0.6;
 constexpr int kLeastAccessDbm = -105;
 
 ifx::ColourCode bsicOf(const Cell& cell) {
@@ -44,7 +44,7 @@ ifx::RrState stateOf(const Activity& activity) {
 ifx::ServingCell servingCell(const Scenario& scenario, Random& random) {
     const RadioLayer& layer = scenario.serving();
     const Cell& cell = layer.campedCell();
-    const int level_dbm = whole(measured(layer.campedLevel_dbm(), kLevelNoiseDb, random));
+    const int level_dbm = whole(measured(layer.campedLevel_dbm(), kRxLevelNoiseDb, random));
     return {cell.channel, bsicOf(cell), level_dbm, level_dbm - kLeastAccessDbm,
             cell.area,    cell.identity};
 }
@@ -59,7 +59,7 @@ std::size_t neighbourCells(const Scenario& scenario, Random& random, Neighbours&
     std::size_t count = 0;
     for (const std::size_t index : heard.first(std::min(heard.size(), cells.size()))) {
         const Cell& cell = layer.cells()[index];
-        const int level_dbm = whole(measured(layer.level_dbm(index), kLevelNoiseDb, random));
+        const int level_dbm = whole(measured(layer.level_dbm(index), kRxLevelNoiseDb, random));
         cells[count++] = {cell.channel, level_dbm >= kReadableDbm, bsicOf(cell), level_dbm};
     }
     return count;

@@ -1,32 +1,31 @@
 #include "simulator/ifx/Picture.h"
 
-#include "simulator/ifx/BinaryObjectWriter.h"
-#include "simulator/ifx/XmlObjectWriter.h"
+#include "plist/XmlStream.h"
+#include "simulator/ifx/BinaryMessage.h"
+
+#include <concepts>
+#include <string>
 
 namespace pallax::ifx {
 
 namespace {
 
-// A list begins with its header.
-static_assert(1 + Picture::kMostNeighbours <= BinaryObjectWriter::kMostInContainer);
-static_assert(1 + Picture::kMostHopping <= BinaryObjectWriter::kMostInContainer);
-
 Word wordOf(RrState state) {
     switch (state) {
     case RrState::Off:
-        return Word::Off;
+        return "Off";
     case RrState::Selection:
-        return Word::CellSelection;
+        return "Cell Selection";
     case RrState::Establishment:
-        return Word::ConnectionEstablishment;
+        return "Connection Establishment";
     case RrState::Dedicated:
-        return Word::Dedicated;
+        return "Dedicated";
     case RrState::Release:
-        return Word::ConnectionRelease;
+        return "Connection Release";
     case RrState::Idle:
         break;
     }
-    return Word::Idle;
+    return "Idle";
 }
 
 /// Tells a writer of one of the forms what a picture holds. The modem wraps what has a unit or a
@@ -39,14 +38,14 @@ public:
     void tell(const Picture& picture) {
         _writer.beginDictionary();
         network(picture.isRegistered);
-        _writer.key(Word::Rr);
+        _writer.key("RR");
         _writer.beginDictionary();
-        _writer.key(Word::State);
-        wrapped(Word::Name, wordOf(picture.state));
+        _writer.key("State");
+        wrapped("Name", wordOf(picture.state));
         _writer.endDictionary();
         serving(picture.serving);
         neighbours(picture.neighbours);
-        _writer.key(Word::DedicatedChannel);
+        _writer.key("Dedicated Channel");
         if (picture.dedicated) {
             dedicated(*picture.dedicated);
         } else {
@@ -65,20 +64,21 @@ private:
         _writer.key(key);
         _writer.text(value);
     }
-    template <class Number>
-    void entry(Word key, Number number) {
+    void entry(Word key, std::integral auto number) { entry(key, std::to_string(number)); }
+    void entry(Word key, const std::same_as<std::string> auto& text) {
         _writer.key(key);
-        _writer.shortText(number);
+        _writer.text(text);
     }
     void bsic(ColourCode code) {
-        _writer.key(Word::Bsic);
-        _writer.shortText(code.network, std::string_view(","), code.station);
+        std::string text = std::to_string(code.network);
+        text += ',';
+        text += std::to_string(code.station);
+        entry("BSIC", text);
     }
     void level(Word key, int level_dbm) {
         _writer.key(key);
         _writer.beginDictionary();
-        _writer.key(Word::Value);
-        _writer.shortText(level_dbm, std::string_view(" dBm"));
+        entry("Value", std::to_string(level_dbm) + " dBm");
         _writer.endDictionary();
     }
 
@@ -92,48 +92,48 @@ private:
 
 template <class Writer>
 void Teller<Writer>::network(bool isRegistered) {
-    _writer.key(Word::Network);
+    _writer.key("Network");
     _writer.beginDictionary();
-    _writer.key(Word::Registered);
+    _writer.key("Registered");
     if (isRegistered) {
         _writer.beginDictionary();
-        entry(Word::Name, Word::SampleNet);
-        entry(Word::Mcc, Word::Mcc262);
-        entry(Word::Mnc, Word::Mnc42);
+        entry("Name", "Sample Net");
+        entry("MCC", "262");
+        entry("MNC", "42");
         _writer.endDictionary();
     } else {
-        _writer.text(Word::No);
+        _writer.text(Word("No"));
     }
     _writer.endDictionary();
 }
 
 template <class Writer>
 void Teller<Writer>::serving(const ServingCell& cell) {
-    _writer.key(Word::ServingCell);
+    _writer.key("Serving Cell");
     _writer.beginDictionary();
-    entry(Word::Arfcn, cell.arfcn);
+    entry("ARFCN", cell.arfcn);
     bsic(cell.bsic);
-    level(Word::RxLevel, cell.level_dbm);
-    entry(Word::C1, cell.c1);
-    _writer.key(Word::Area);
+    level("Rx Level", cell.level_dbm);
+    entry("C1", cell.c1);
+    _writer.key("Area");
     _writer.beginDictionary();
-    entry(Word::Lac, cell.locationArea);
-    entry(Word::CellId, cell.cellId);
+    entry("LAC", cell.locationArea);
+    entry("Cell ID", cell.cellId);
     _writer.endDictionary();
     _writer.endDictionary();
 }
 
 template <class Writer>
 void Teller<Writer>::neighbours(std::span<const NeighbourCell> cells) {
-    _writer.key(Word::NeighbourCells);
+    _writer.key("Neighbour Cells");
     _writer.beginArray();
-    _writer.text(Word::NeighbourHeader);
+    _writer.text(Word("ARFCN, BSIC, Rx Level"));
     for (const NeighbourCell& cell : cells) {
         _writer.beginDictionary();
-        entry(Word::Arfcn, cell.arfcn);
+        entry("ARFCN", cell.arfcn);
         if (cell.isRead) {
             bsic(cell.bsic);
-            level(Word::RxLevel, cell.level_dbm);
+            level("Rx Level", cell.level_dbm);
         }
         _writer.endDictionary();
     }
@@ -143,18 +143,18 @@ void Teller<Writer>::neighbours(std::span<const NeighbourCell> cells) {
 template <class Writer>
 void Teller<Writer>::dedicated(const DedicatedChannel& channel) {
     _writer.beginDictionary();
-    _writer.key(Word::Channel);
-    wrapped(Word::Type, channel.type == ChannelType::Traffic ? Word::TchF : Word::Sdcch8);
-    entry(Word::TimeSlot, channel.timeSlot);
-    entry(Word::TimingAdvance, channel.timingAdvance);
-    entry(Word::RxQuality, channel.quality);
-    level(Word::TxPower, channel.power_dbm);
+    _writer.key("Channel");
+    wrapped("Type", channel.type == ChannelType::Traffic ? Word("TCH/F") : Word("SDCCH/8"));
+    entry("Time Slot", channel.timeSlot);
+    entry("Timing Advance", channel.timingAdvance);
+    entry("Rx Quality", channel.quality);
+    level("Tx Power", channel.power_dbm);
     if (!channel.hopping.empty()) {
-        _writer.key(Word::Hopping);
+        _writer.key("Hopping");
         _writer.beginArray();
-        _writer.text(Word::HoppingHeader);
+        _writer.text(Word("MAIO 3, HSN 17"));
         for (const unsigned arfcn : channel.hopping) {
-            _writer.shortText(arfcn);
+            _writer.text(std::to_string(arfcn));
         }
         _writer.endArray();
     }
@@ -164,14 +164,15 @@ void Teller<Writer>::dedicated(const DedicatedChannel& channel) {
 } // namespace
 
 void encode(const Picture& picture, ListForm form, ByteBuffer& out) {
+    const auto writeTo = [&](auto writer) {
+        Teller(writer).tell(picture);
+        const std::string_view message = writer.finish();
+        out.assign(message.begin(), message.end());
+    };
     if (form == ListForm::Binary) {
-        BinaryObjectWriter writer;
-        Teller(writer).tell(picture);
-        writer.finish(out);
+        writeTo(BinaryMessage());
     } else {
-        XmlObjectWriter writer;
-        Teller(writer).tell(picture);
-        writer.finish(out);
+        writeTo(XmlStream());
     }
 }
 

@@ -1,56 +1,13 @@
 #pragma once
 
 #include <array>
-#include <cstddef>
 #include <cstdint>
 #include <string_view>
 
 namespace pallax::ifx {
 
-/// The texts that stand in many messages just the same: all keys, and the names of states.
-enum class Word : std::uint8_t {
-    Network,
-    Registered,
-    Name,
-    Mcc,
-    Mnc,
-    Rr,
-    State,
-    ServingCell,
-    Arfcn,
-    Bsic,
-    RxLevel,
-    Value,
-    C1,
-    Area,
-    Lac,
-    CellId,
-    NeighbourCells,
-    NeighbourHeader,
-    DedicatedChannel,
-    Channel,
-    Type,
-    TimeSlot,
-    TimingAdvance,
-    RxQuality,
-    TxPower,
-    Hopping,
-    HoppingHeader,
-    SampleNet,
-    Mcc262,
-    Mnc42,
-    No,
-    Off,
-    CellSelection,
-    ConnectionEstablishment,
-    Idle,
-    Dedicated,
-    ConnectionRelease,
-    TchF,
-    Sdcch8,
-    Count
-};
-
+/// The texts that stand in many messages just the same: all keys, and the names of states. Each
+/// binary message begins with all of them in this order.
 inline constexpr auto kWords = std::to_array<std::string_view>({
     "Network",
     "Registered",
@@ -92,10 +49,21 @@ inline constexpr auto kWords = std::to_array<std::string_view>({
     "TCH/F",
     "SDCCH/8",
 });
-static_assert(kWords.size() == static_cast<std::size_t>(Word::Count));
 
-constexpr std::string_view textOf(Word word) {
-    return kWords[static_cast<std::size_t>(word)];
-}
+/// One of them. A text that is none does not compile.
+class Word {
+public:
+    consteval Word(const char* text) {
+        while (kWords.at(_number) != text) {
+            ++_number;
+        }
+    }
+
+    std::uint32_t number() const { return _number; } ///< from 0
+    operator std::string_view() const { return kWords[_number]; }
+
+private:
+    std::uint32_t _number = 0;
+};
 
 } // namespace pallax::ifx

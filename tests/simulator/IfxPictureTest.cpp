@@ -1,5 +1,5 @@
 #include "plist/PropertyListCodec.h"
-#include "simulator/ifx/BinaryObjectWriter.h"
+#include "simulator/ifx/BinaryMessage.h"
 #include "simulator/ifx/Picture.h"
 #include "tests/simulator/Values.h"
 
@@ -130,49 +130,22 @@ TEST(IfxPicture, ItsFormsHoldTheSameAndItsXmlIsThatOfTheSerialiser) {
 }
 
 TEST(IfxPicture, AMessageThatHoldsTooMuchIsRefused) {
-    using ifx::BinaryObjectWriter;
-    /// How many texts are read back of `lists` arrays that hold `count` of them each.
-    const auto writeTexts = [](std::size_t lists, std::size_t count, const auto&... parts) {
-        BinaryObjectWriter writer;
-        writer.beginArray();
-        for (std::size_t list = 0; list < lists; ++list) {
-            writer.beginArray();
-            for (std::size_t index = 0; index < count; ++index) {
-                writer.shortText(parts...);
-            }
-            writer.endArray();
+    const auto textsReadBack = [](std::size_t count) {
+        ifx::BinaryMessage message;
+        message.beginArray();
+        for (std::size_t index = 0; index < count; ++index) {
+            message.text(std::to_string(index));
         }
-        writer.endArray();
-        ByteBuffer out;
-        writer.finish(out);
-        const auto object = parsePropertyList(out);
-        std::size_t texts = 0;
-        for (const PropertyList& list : *object->array()) {
-            texts += list.array()->size();
-        }
-        return texts;
+        message.endArray();
+        const std::string_view list = message.finish();
+        const auto object = parsePropertyList(ByteBuffer(list.begin(), list.end()));
+        return object->array()->size();
     };
-    constexpr std::size_t kMost = BinaryObjectWriter::kMostInContainer;
-    using Letters = std::string_view;
-    EXPECT_EQ(writeTexts(3, kMost, 12345U, Letters("nine more")), 3 * kMost);
-    EXPECT_EQ(writeTexts(1, 0, 1), 0U);
-    EXPECT_THROW(writeTexts(1, 1, Letters("eleven more")), std::length_error);
-    EXPECT_THROW(writeTexts(1, 1, 123456U, Letters("nine more")), std::length_error);
-    EXPECT_THROW(writeTexts(1, kMost + 1, 1), std::length_error);
-    BinaryObjectWriter large;
-    const auto writeLarge = [&large](auto&& self, std::size_t levels) -> void {
-        large.beginArray();
-        for (std::size_t index = 0; index < kMost; ++index) {
-            levels == 0 ? large.shortText(1) : self(self, levels - 1);
-        }
-        large.endArray();
-    };
-    EXPECT_THROW(writeLarge(writeLarge, 2), std::length_error) << "of 512 texts";
-    BinaryObjectWriter deep;
-    for (std::size_t depth = 0; depth < BinaryObjectWriter::kDeepest; ++depth) {
-        deep.beginArray();
-    }
-    EXPECT_THROW(deep.beginArray(), std::length_error);
+    constexpr std::size_t kMostObjects = 256;
+    constexpr std::size_t kMostTexts = kMostObjects - ifx::kWords.size() - 1; // and the array
+    EXPECT_EQ(textsReadBack(0), 0U);
+    EXPECT_EQ(textsReadBack(kMostTexts), kMostTexts);
+    EXPECT_THROW(textsReadBack(kMostTexts + 1), std::length_error);
 }
 
 } // namespace
