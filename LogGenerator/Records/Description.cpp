@@ -56,6 +56,9 @@ CodeDescription describe(const CodeLayout& layout) {
             {subpacket.id, describeFields(subpacket.fields), describe(subpacket.lists)});
     }
     if (const ListPart* part = layout.listPart) {
+        if (part->kind == ListPart::Kind::Elements) {
+            code.fields.clear(); // an element is shown as it comes
+        }
         code.listPart = ListPartDescription{part->kind,
                                             {part->technologies.begin(), part->technologies.end()},
                                             part->cellType,

@@ -284,6 +284,7 @@ struct RecordLayout {
     std::span<const CodeLayout> codes = {}; ///< in the order of the subscriptions
     LogPriority priority = LogPriority::Warning;
     bool reportsOtherCodes = true; ///< as unknown log messages
+    bool readsOtherCodes = false;  ///< as the first of `codes`
 };
 
 /// How many rows of fields there are: each field of each list once.

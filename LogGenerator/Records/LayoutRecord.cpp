@@ -95,10 +95,13 @@ const LayoutRecord::Code* LayoutRecord::codeOf(LogCode logCode) const {
     const auto found = std::find_if(_codes.begin(), _codes.end(), [logCode](const Code& each) {
         return each.layout->logCode == logCode;
     });
-    return found != _codes.end() ? &*found : nullptr;
+    if (found != _codes.end()) {
+        return &*found;
+    }
+    return _layout.readsOtherCodes ? &_codes.front() : nullptr;
 }
 
-void LayoutRecord::updateWithData(const LogRecord& record, LogCode logCode) {
+void LayoutRecord::receive(const LogRecord& record, LogCode logCode) {
     systemLog(_layout.priority, "%s", _layout.logLine);
     const Code* code = codeOf(logCode);
     if (code == nullptr) {

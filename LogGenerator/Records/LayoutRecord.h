@@ -18,13 +18,13 @@ public:
     std::string_view getSectionName() const override { return _layout.section; }
     std::span<const LogCode> getLogCodeArray() const override { return _logCodes; }
     void updateSectionRef(PropertyList section) override;
+    void updateWithData(const LogRecord& record, LogCode logCode) override {
+        receive(record, logCode);
+        catchUp();
+    }
     /// Logs what the record tells, and gives its samples to the sink at once. The display may read
     /// it later.
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-
-    void receive(const LogRecord& record, LogCode logCode) override {
-        updateWithData(record, logCode);
-    }
+    void receive(const LogRecord& record, LogCode logCode) override;
     void catchUp() override { _display.bringUpToDate(); }
     SectionKind sectionKind() const override { return _layout.kind; }
     RecordDescription describe() const override;
