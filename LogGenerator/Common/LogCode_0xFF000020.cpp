@@ -14,9 +14,4 @@ LogCode_0xFF000020::LogCode_0xFF000020(const LogRecord& record) {
     _files = std::move(parsed).value();
 }
 
-const PropertyList* LogCode_0xFF000020::file(std::string_view key) const {
-    const DictionaryRef files = _files.dictionary();
-    return files != nullptr ? files->find(key) : nullptr;
-}
-
 } // namespace pallax

@@ -4,7 +4,6 @@
 #include "plist/PropertyList.h"
 
 #include <exception>
-#include <string_view>
 
 namespace pallax {
 
@@ -25,9 +24,8 @@ public:
     /// the log, when the payload is no property list.
     explicit LogCode_0xFF000020(const LogRecord& record);
 
-    /// What the service sent for a SIM file, of whatever type, or null when it sent nothing for it
-    /// (nothing at all, where the root is no dictionary). Valid as long as the reader.
-    const PropertyList* file(std::string_view key) const;
+    /// What the service sent: a dictionary, unless the payload is another property list.
+    const PropertyList& files() const { return _files; }
 
 private:
     PropertyList _files;

@@ -1,35 +1,44 @@
 #include "LogGenerator/Common/PDPContextList.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
 #include "plist/PropertyListCodec.h"
+
+#include <array>
 
 namespace pallax {
 
 namespace {
 
-constexpr auto kLogCodes = std::to_array<LogCode>({kPDPContextsLogCode});
+constexpr auto kContextFields = std::to_array<Field>({Field{}.personal()});
+
+std::optional<PropertyList> parseContexts(const LogRecord& record) {
+    PropertyListResult contexts = parsePropertyList(record.payload());
+    return contexts ? std::optional(std::move(contexts).value()) : std::nullopt;
+}
+
+constexpr ListPart kContexts{
+    .kind = ListPart::Kind::Elements,
+    .parse = parseContexts,
+    .words = "the array of contexts, as the telephony service describes them",
+};
+
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = kPDPContextsLogCode,
+    .name = "Contexts of packet data",
+    .fields = kContextFields,
+    .listPart = &kContexts,
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "PDP Context Info",
+    .logLine = "PDPContextList",
+    .kind = SectionKind::List,
+    .meaning = "The contexts of packet data, each as the telephony service describes it.",
+    .codes = kCodes,
+    .readsOtherCodes = true,
+};
 
 } // namespace
 
-std::span<const LogCode> PDPContextList::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void PDPContextList::updateWithData(const LogRecord& record, LogCode /*logCode*/) {
-    systemLog(LogPriority::Warning, "PDPContextList");
-    const PropertyListResult parsed = parsePropertyList(record.payload());
-    const ArrayRef contexts = parsed ? parsed->array() : nullptr;
-    if (contexts != nullptr) {
-        replaceList(*contexts);
-    }
-}
-
-RecordDescription PDPContextList::describe() const {
-    CodeDescription code{kPDPContextsLogCode};
-    code.listPart = {.kind = ListPartDescription::Kind::Elements,
-                     .words = "the array of contexts, as the telephony service describes them"};
-    return {std::move(code)};
-}
+PDPContextList::PDPContextList() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -9,13 +9,9 @@ namespace pallax {
 ///   0xFF0002: a property list from byte 13 on, an array; the list becomes its elements, unchanged
 ///
 /// A payload that is no array, or no property list at all, changes nothing and is not reported.
-class PDPContextList final : public Base {
+class PDPContextList final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "PDP Context Info"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    RecordDescription describe() const override;
+    PDPContextList();
 };
 
 } // namespace pallax

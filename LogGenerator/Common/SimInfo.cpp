@@ -1,67 +1,73 @@
 #include "LogGenerator/Common/SimInfo.h"
 
 #include "LogGenerator/Common/LogCode_0xFF000020.h"
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
+
+#include <array>
 
 namespace pallax {
 
 namespace {
 
-constexpr auto kLogCodes = std::to_array<LogCode>({kSimFilesLogCode});
+constexpr Field simFile(std::string_view listKey, std::string_view key, std::string_view meaning) {
+    Field field{.key = key, .meaning = meaning};
+    field.listKey = listKey;
+    return field;
+}
 
-struct SimFile {
-    std::string_view propertyListKey;
-    std::string_view key;
-};
-
-constexpr auto kSimFiles = std::to_array<SimFile>({
-    {"kSimFile_ICCID", "EF-ICCID"},
-    {"kSimFile_MSISDN", "EF-MSISDN"},
-    {"kSimFile_MBDN", "EF-3GPP MAIL BOX DIALING NUMBER"},
-    {"kSimFile_HPPLMN", "EF-HPPLMN SEARCH PERIOD"},
-    {"kSimFile_LOCI", "EF-LOCI"},
-    {"kSimFile_PSLOCI", "EF-GPRS/PS-LOCI"},
-    {"kSimFile_ACC", "EF-ACCESS CONTROL CLASS"},
-    {"kSimFile_AD", "EF-ADMINISTRATIVE DATA"},
-    {"kSimFile_FPLMN", "EF-FPLMN"},
-    {"kSimFile_AHPLMN", "EF-ACTING HPLMN"},
-    {"kSimFile_RATMODE", "EF-RAT MODE"},
-    {"kSimFile_PNN", "EF-PLMN NETWORK NAME"},
-    {"kSimFile_OPL", "EF-OPERATOR PLMN LIST"},
-    {"kSimFile_OPLMNAcT", "EF-OPLMNAcT"},
+constexpr auto kSimFiles = std::to_array<Field>({
+    simFile("kSimFile_ICCID", "EF-ICCID", "Identity of the card.").personal(),
+    simFile("kSimFile_MSISDN", "EF-MSISDN", "The subscriber's own number.").personal(),
+    simFile("kSimFile_MBDN", "EF-3GPP MAIL BOX DIALING NUMBER", "Number of the voice mailbox.")
+        .personal(),
+    simFile("kSimFile_HPPLMN", "EF-HPPLMN SEARCH PERIOD",
+            "How often a roaming phone looks for a network of higher priority."),
+    simFile("kSimFile_LOCI", "EF-LOCI",
+            "Temporary identity, location area and update status of the circuit-switched domain.")
+        .personal(),
+    simFile("kSimFile_PSLOCI", "EF-GPRS/PS-LOCI",
+            "Temporary identity, routing area and update status of the packet-switched domain.")
+        .personal(),
+    simFile("kSimFile_ACC", "EF-ACCESS CONTROL CLASS", "Access control classes of the subscriber."),
+    simFile("kSimFile_AD", "EF-ADMINISTRATIVE DATA",
+            "Mode of operation of the card, and the length of the network code in its IMSI."),
+    simFile("kSimFile_FPLMN", "EF-FPLMN", "Forbidden networks."),
+    simFile("kSimFile_AHPLMN", "EF-ACTING HPLMN", "Network that counts as the home network."),
+    simFile("kSimFile_RATMODE", "EF-RAT MODE", "Radio access technologies that the card prefers."),
+    simFile("kSimFile_PNN", "EF-PLMN NETWORK NAME", "Names of networks."),
+    simFile("kSimFile_OPL", "EF-OPERATOR PLMN LIST",
+            "For which networks and areas the names of EF-PNN hold."),
+    simFile("kSimFile_OPLMNAcT", "EF-OPLMNAcT",
+            "Networks that the operator prefers, with their access technologies."),
 });
 static_assert(kSimFiles.size() == 14);
 
+std::optional<PropertyList> parseFiles(const LogRecord& record) {
+    return LogCode_0xFF000020(record).files();
+}
+
+constexpr ListPart kFiles{
+    .kind = ListPart::Kind::Keys,
+    .parse = parseFiles,
+    .words = "the dictionary of SIM files; values of any type, as they come",
+};
+
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = kSimFilesLogCode,
+    .name = "SIM files",
+    .fields = kSimFiles,
+    .listPart = &kFiles,
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "SIM Info",
+    .logLine = "SimInfo",
+    .meaning = "Elementary files of the SIM, as the telephony service has read them.",
+    .codes = kCodes,
+    .reportsOtherCodes = false,
+};
+
 } // namespace
 
-std::span<const LogCode> SimInfo::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void SimInfo::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "SimInfo");
-    if (logCode != kSimFilesLogCode) {
-        return;
-    }
-    const LogCode_0xFF000020 files(record);
-    for (const SimFile& simFile : kSimFiles) {
-        if (const PropertyList* content = files.file(simFile.propertyListKey)) {
-            show(simFile.key, *content);
-        }
-    }
-}
-
-RecordDescription SimInfo::describe() const {
-    CodeDescription code{kSimFilesLogCode};
-    code.listPart = {.kind = ListPartDescription::Kind::Keys,
-                     .words = "the dictionary of SIM files; values of any type, as they come"};
-    for (const SimFile& simFile : kSimFiles) {
-        FieldDescription field{std::string(simFile.key)};
-        field.listKey = simFile.propertyListKey;
-        code.fields.push_back(std::move(field));
-    }
-    return {std::move(code)};
-}
+SimInfo::SimInfo() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

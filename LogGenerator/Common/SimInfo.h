@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -25,13 +25,10 @@ namespace pallax {
 ///   kSimFile_OPLMNAcT          EF-OPLMNAcT
 ///
 /// A file that the service does not send keeps what was shown for it.
-class SimInfo final : public Base {
+/// Reading throws LogCode_0xFF000020::UnknownDataException when the payload is no property list.
+class SimInfo final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "SIM Info"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    /// Throws LogCode_0xFF000020::UnknownDataException when the payload is no property list.
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    RecordDescription describe() const override;
+    SimInfo();
 };
 
 } // namespace pallax
