@@ -1,7 +1,6 @@
 #include "LogGenerator/ZOR_GSM/ActiveSet.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "LogGenerator/Records/EntryList.h"
+#include "LogGenerator/ZOR_GSM/SearcherRecord.h"
 
 #include <algorithm>
 #include <array>
@@ -11,87 +10,99 @@ namespace pallax {
 namespace {
 
 constexpr Position kReceiveAgc = s16At(13);
+constexpr Position kCellCount = u8At(15);
 
 constexpr std::size_t kCellStride = 15;
-constexpr std::size_t kCellBytesRead = 9;
-constexpr Position kSetType = bitsAt(8, 5, 3);
-constexpr std::int64_t kActive = 0;
-
 constexpr std::size_t kPathLength = 44;
-constexpr auto kEnergyOffsets = std::to_array<std::size_t>({32, 36, 40});
+constexpr Condition kIsActive{bitsAt(8, 5, 3), 0, 0};
 
-constexpr auto kCellFields = std::to_array<Field>({
-    {"Scrambling Code", bitsAt(7, 0, 13), Conversion::number()},
+/// Of a path record.
+constexpr auto kEnergies = std::to_array<Extent>({
+    extentOf(u32At(32), Extent::Origin::Companion),
+    extentOf(u32At(36), Extent::Origin::Companion),
+    extentOf(u32At(40), Extent::Origin::Companion),
+});
+constexpr auto kEnergiesAndAgc = std::to_array<Extent>({
+    kEnergies[0],
+    kEnergies[1],
+    kEnergies[2],
+    extentOf(kReceiveAgc, Extent::Origin::Record),
 });
 
-/// The first energy of the path record that is not 0, or 0.
-std::uint32_t energyOf(const LogRecord& path) {
-    const auto* const offset =
-        std::find_if(kEnergyOffsets.begin(), kEnergyOffsets.end(),
-                     [&path](std::size_t candidate) { return path.u32(candidate) != 0; });
-    return offset != kEnergyOffsets.end() ? path.u32(*offset) : 0;
+/// Of the first energy of the path record that is not 0, or of 0.
+std::int64_t ecio_db(const LogRecord& path) {
+    const auto* const energy =
+        std::find_if(kEnergies.begin(), kEnergies.end(),
+                     [&path](const Extent& candidate) { return path.u32(candidate.byte) != 0; });
+    return Base::lookUpECNO(energy != kEnergies.end() ? path.u32(energy->byte) : 0);
 }
 
-std::int64_t rscp_db(std::int64_t receiveAgc, std::int64_t ecio_db) {
+PropertyList energyPerChip(const Place& place) {
+    return DisplayNumber(ecio_db(place.companion), kDecimalDb);
+}
+
+PropertyList rscp(const Place& place) {
     constexpr std::int64_t kAgcOffset = 512;
     constexpr std::int64_t kAgcStepsPerDb = 10;
     constexpr std::int64_t kFloorDbm = 106;
-    return (receiveAgc + kAgcOffset) / kAgcStepsPerDb - kFloorDbm + ecio_db;
+    const std::int64_t receiveAgc = place.record.read(kReceiveAgc);
+    return DisplayNumber((receiveAgc + kAgcOffset) / kAgcStepsPerDb - kFloorDbm +
+                             ecio_db(place.companion),
+                         kDecimalDb);
 }
+
+constexpr Computation kRscp{
+    .name = "rscp",
+    .formula = "(A + 512) / 10 toward zero - 106 + Energy Per Chip, A being the receive AGC, "
+               "signed",
+    .read = kEnergiesAndAgc,
+    .compute = rscp,
+};
+constexpr Computation kEnergyPerChip{
+    .name = "ecno",
+    .formula = "whole dB of the first of the three energies of the cell's path that is not 0",
+    .read = kEnergies,
+    .compute = energyPerChip,
+};
+
+constexpr auto kCellFields = std::to_array<Field>({
+    Field{"Scrambling Code", bitsAt(7, 0, 13), Conversion::number(),
+          "Primary scrambling code of the cell."}
+        .identifying(),
+    computed("RSCP", kDecimalDb, kRscp,
+             "Received signal code power of the cell's pilot, worked out of receiver gain and "
+             "Ec/Io."),
+    computed("Energy Per Chip", kDecimalDb, kEnergyPerChip,
+             "Ec/Io of the cell's pilot: energy per chip over the whole received power."),
+});
+
+constexpr auto kLists = std::to_array<ListLayout>({{
+    .entries = {{.start = kSearcherRecordLength, .stride = kCellStride, .bytesRead = 9}},
+    .count = kCellCount,
+    .fields = kCellFields,
+    .only = &kIsActive,
+    .companion = EntryRun{{kSearcherRecordLength, kPathLength, kPathLength},
+                          EntryRun::Move{kCellStride, kCellCount}},
+}});
+
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = kSearcherLogCode,
+    .name = "Cells of the UMTS searcher",
+    .minimumLength = kSearcherRecordLength,
+    .lists = kLists,
+    .note = "Only the cells of the active set are shown.",
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "Active Set",
+    .logLine = "ActiveSet",
+    .kind = SectionKind::List,
+    .meaning = "The UMTS cells that the phone is connected through.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-Array ActiveSet::cellsOf(const LogRecord& record) const {
-    const std::size_t count = cellCount(record);
-    const EntryList cells(record, {kCellsStart, kCellStride, kCellBytesRead}, count);
-    const EntryList paths(record, {kCellsStart + kCellStride * count, kPathLength, kPathLength},
-                          count);
-    const std::int64_t receiveAgc = record.read(kReceiveAgc);
-    Array active;
-    const std::size_t whole = cells.wholeCount();
-    for (std::size_t index = 0; index < whole; ++index) {
-        if (cells.at(index).read(kSetType) != kActive) {
-            continue;
-        }
-        if (!paths.isWhole(index)) {
-            break; // the path record is part of the cell
-        }
-        const std::int64_t ecio_db = lookUpECNO(energyOf(paths.at(index)));
-        Dictionary cell = entryOf(kCellFields, cells.at(index));
-        cell.setFixed("RSCP", DisplayNumber(rscp_db(receiveAgc, ecio_db), kDecimalDb));
-        cell.setFixed("Energy Per Chip", DisplayNumber(ecio_db, kDecimalDb));
-        active.emplace_back(std::move(cell));
-    }
-    return active;
-}
-
-RecordDescription ActiveSet::describe() const {
-    std::vector<Extent> energies;
-    energies.reserve(kEnergyOffsets.size());
-    for (const std::size_t offset : kEnergyOffsets) {
-        energies.push_back(extentOf(u32At(offset), Extent::Origin::Companion));
-    }
-    std::vector<Extent> energiesAndAgc = energies;
-    energiesAndAgc.push_back(extentOf(kReceiveAgc, Extent::Origin::Record));
-
-    const EntryList::Layout cells{kCellsStart, kCellStride, kCellBytesRead};
-    ListDescription list = describeList("", cells, u8At(kCellCountOffset), kCellFields);
-    list.only = Condition{kSetType, kActive, kActive};
-    list.companion = EntryRun{{kCellsStart, kPathLength, kPathLength},
-                              EntryRun::Move{kCellStride, u8At(kCellCountOffset)}};
-    list.fields.push_back(describeComputed(
-        "RSCP", kDecimalDb, "rscp",
-        "(A + 512) / 10 toward zero - 106 + Energy Per Chip, A being the receive AGC, signed",
-        std::move(energiesAndAgc)));
-    list.fields.push_back(describeComputed(
-        "Energy Per Chip", kDecimalDb, "ecno",
-        "whole dB of the first of the three energies of the cell's path that is not 0",
-        std::move(energies)));
-
-    RecordDescription description = SearcherSet::describe();
-    description.front().lists = {std::move(list)};
-    description.front().note = "Only the cells of the active set are shown.";
-    return description;
-}
+ActiveSet::ActiveSet() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

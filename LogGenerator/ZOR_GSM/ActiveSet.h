@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/ZOR_GSM/SearcherSet.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -28,14 +28,9 @@ namespace pallax {
 ///   key              shown as
 ///   RSCP             (A + 512) / 10 toward zero - 106 + Ec/Io, dB
 ///   Energy Per Chip  Ec/Io: lookUpECNO of the energy, dB
-class ActiveSet final : public SearcherSet {
+class ActiveSet final : public LayoutRecord {
 public:
-    ActiveSet() : SearcherSet("ActiveSet") {}
-    std::string_view getSectionName() const override { return "Active Set"; }
-    RecordDescription describe() const override;
-
-private:
-    Array cellsOf(const LogRecord& record) const override;
+    ActiveSet();
 };
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -17,13 +17,9 @@ namespace pallax {
 ///   0     8      Transport Channel ID   number
 ///   1     32     CRC Received           signed
 ///   5     32     CRC Received in Error  signed
-class BLER final : public Base {
+class BLER final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "BLER"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    BLER();
 };
 
 } // namespace pallax

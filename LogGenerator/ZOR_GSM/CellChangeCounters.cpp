@@ -1,16 +1,18 @@
 #include "LogGenerator/ZOR_GSM/CellChangeCounters.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
-
 namespace pallax {
 
-void CellChangeCounters::updateWithData(const LogRecord& /*record*/, LogCode /*logCode*/) {
-    systemLog(LogPriority::Warning, "CellChangeCounters");
-}
+namespace {
 
-RecordDescription CellChangeCounters::describe() const {
-    return {};
-}
+constexpr RecordLayout kLayout{
+    .section = "Cell Change Counters",
+    .logLine = "CellChangeCounters",
+    .meaning = "Counters of cell changes; no log code is known to carry them.",
+    .reportsOtherCodes = false,
+};
+
+} // namespace
+
+CellChangeCounters::CellChangeCounters() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,17 +1,14 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
 /// The cell-change counters, section "Cell Change Counters". No log code is known to carry them:
 /// the section shows, and stays empty.
-class CellChangeCounters final : public Base {
+class CellChangeCounters final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Cell Change Counters"; }
-    std::span<const LogCode> getLogCodeArray() const override { return {}; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    RecordDescription describe() const override;
+    CellChangeCounters();
 };
 
 } // namespace pallax

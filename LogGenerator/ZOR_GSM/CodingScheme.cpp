@@ -1,16 +1,18 @@
 #include "LogGenerator/ZOR_GSM/CodingScheme.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
-
 namespace pallax {
 
-void CodingScheme::updateWithData(const LogRecord& /*record*/, LogCode /*logCode*/) {
-    systemLog(LogPriority::Warning, "CellChangeCounters"); // the line of the counters, on purpose
-}
+namespace {
 
-RecordDescription CodingScheme::describe() const {
-    return {};
-}
+constexpr RecordLayout kLayout{
+    .section = "Coding Scheme",
+    .logLine = "CellChangeCounters", // the line of the counters, on purpose
+    .meaning = "GPRS coding schemes; no log code is known to carry them.",
+    .reportsOtherCodes = false,
+};
+
+} // namespace
+
+CodingScheme::CodingScheme() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

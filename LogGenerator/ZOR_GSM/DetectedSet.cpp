@@ -1,11 +1,21 @@
 #include "LogGenerator/ZOR_GSM/DetectedSet.h"
 
+#include "LogGenerator/ZOR_GSM/SearcherRecord.h"
+
 namespace pallax {
 
-DetectedSet::DetectedSet() : SearcherSet("DetectedSet") {}
+namespace {
 
-std::string_view DetectedSet::getSectionName() const {
-    return "Detected Set";
-}
+constexpr RecordLayout kLayout{
+    .section = "Detected Set",
+    .logLine = "DetectedSet",
+    .kind = SectionKind::List,
+    .meaning = "The UMTS cells that the phone has found by itself; the list is always empty.",
+    .codes = kEmptiedSetCodes,
+};
+
+} // namespace
+
+DetectedSet::DetectedSet() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

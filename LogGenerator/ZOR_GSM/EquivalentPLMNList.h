@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -17,14 +17,9 @@ namespace pallax {
 ///   1, 3, 5     Mobile Network Code    number: 100 x byte 1 + 10 x byte 3 + byte 5
 ///
 /// So neighbouring entries overlap by three bytes. The bytes are whole digits, none is refused.
-class EquivalentPLMNList final : public Base {
+class EquivalentPLMNList final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Equivalent PLMN List"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    EquivalentPLMNList();
 };
 
 } // namespace pallax

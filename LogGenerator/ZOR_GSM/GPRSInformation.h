@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -38,13 +38,9 @@ namespace pallax {
 ///
 /// A table by byte plus one starts with what 255 means, the modem's value for a parameter that is
 /// not present; beyond a table stands "Unknown" where nothing else is said.
-class GPRSInformation final : public Base {
+class GPRSInformation final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "GPRS Information"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    GPRSInformation();
 };
 
 } // namespace pallax

@@ -1,8 +1,8 @@
 #include "LogGenerator/ZOR_GSM/GSMRRInfo.h"
 
-#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/SharedLogCodes.h"
-#include "platform/SystemLog.h"
+
+#include <array>
 
 namespace pallax {
 
@@ -38,51 +38,70 @@ constexpr auto kRRStates = std::to_array<std::string_view>({
 static_assert(kRRStates.size() == 22);
 
 constexpr auto kStateFields = std::to_array<Field>({
-    {"RR State", u8At(13), Conversion::label(kRRStates)},
-    {"RR Sub State", u8At(14), Conversion::number()},
-    {"RR Status", u8At(15), Conversion::number()},
-    {"RR Mode", u8At(16), Conversion::flag("Data", "Voice")},
+    {"RR State", u8At(13), Conversion::label(kRRStates), "State of the radio resource layer."},
+    {"RR Sub State", u8At(14), Conversion::number(),
+     "Sub-state of the radio resource layer, as a number."},
+    {"RR Status", u8At(15), Conversion::number(),
+     "Status of the radio resource layer, as a number."},
+    {"RR Mode", u8At(16), Conversion::flag("Data", "Voice"),
+     "Whether the connection is for voice or for data."},
 });
 
 constexpr auto kMeasurementFields = std::to_array<Field>({
-    {"Serving Rx Level", u8At(15), Conversion::number()},
-    {"Rx Quality Full", s32At(16), Conversion::number()},
-    {"Rx Quality Sub", s32At(20), Conversion::number()},
+    {"Serving Rx Level", u8At(15), Conversion::number(),
+     "Receive level of the serving cell, as the modem counts it."},
+    {"Rx Quality Full", s32At(16), Conversion::number(),
+     "Receive quality over all frames; the record holds C1 in the same place."},
+    {"Rx Quality Sub", s32At(20), Conversion::number(),
+     "Receive quality over the frames that are sent in any case; the record holds C2 in the same "
+     "place."},
 });
 
 constexpr auto kDtxFields = std::to_array<Field>({
-    {"DTX Used", u8At(19), Conversion::flag("ON", "OFF")},
+    {"DTX Used", u8At(19), Conversion::flag("ON", "OFF"),
+     "Whether discontinuous transmission is in use."},
 });
 
 constexpr auto kDrxFields = std::to_array<Field>({
-    {"DRX Used", u8At(16), Conversion::number(kSeconds)},
+    {"DRX Used", u8At(16), Conversion::number(kSeconds),
+     "Discontinuous reception: the time for which the phone goes on listening."},
 });
 
-constexpr auto kGroups = std::to_array<FieldGroup>({
-    {0x512C, 17, kStateFields},
-    {kMeasurementLogCode, kMeasurementLength, kMeasurementFields},
-    {0x5072, 20, kDtxFields},
-    {kPacketTimersLogCode, kPacketTimersLength, kDrxFields},
+constexpr auto kCodes = std::to_array<CodeLayout>({
+    {
+        .logCode = 0x512C,
+        .name = "State of the GSM radio resource layer",
+        .minimumLength = 17,
+        .fields = kStateFields,
+    },
+    {
+        .logCode = kMeasurementLogCode,
+        .minimumLength = kMeasurementLength,
+        .fields = kMeasurementFields,
+    },
+    {
+        .logCode = 0x5072,
+        .name = "Discontinuous transmission",
+        .minimumLength = 20,
+        .fields = kDtxFields,
+    },
+    {
+        .logCode = kPacketTimersLogCode,
+        .name = "Packet timers and discontinuous reception",
+        .minimumLength = kPacketTimersLength,
+        .fields = kDrxFields,
+    },
 });
-constexpr auto kLogCodes = logCodesOf(kGroups);
+
+constexpr RecordLayout kLayout{
+    .section = "GSM RR Info",
+    .logLine = "GSMRRInfo",
+    .meaning = "State of the GSM radio resource layer, and its levels.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> GSMRRInfo::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void GSMRRInfo::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "GSMRRInfo");
-    showGroup(kGroups, record, logCode);
-}
-
-bool GSMRRInfo::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return isOfGroup(kGroups, record, logCode);
-}
-
-RecordDescription GSMRRInfo::describe() const {
-    return describeGroups(kGroups);
-}
+GSMRRInfo::GSMRRInfo() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

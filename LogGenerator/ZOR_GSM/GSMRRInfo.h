@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -29,13 +29,9 @@ namespace pallax {
 ///
 /// GSMServingCell reads the words at 16 and 20 of 0x5137 by their low halves, unsigned, and under
 /// other names.
-class GSMRRInfo final : public Base {
+class GSMRRInfo final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "GSM RR Info"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    GSMRRInfo();
 };
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -27,16 +27,9 @@ namespace pallax {
 ///   kHXCellMonitorARFCN     ARFCN      number
 ///
 /// GSMRRInfo reads the words at 16 and 20 of 0x5137 whole, signed, and under other names.
-class GSMServingCell final : public Base {
+class GSMServingCell final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "GSM Serving Cell"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
-
-private:
-    void showServingCell(const LogRecord& record);
+    GSMServingCell();
 };
 
 } // namespace pallax

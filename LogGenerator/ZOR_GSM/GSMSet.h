@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -17,14 +17,9 @@ namespace pallax {
 ///   2     16     BSIC           number
 ///   4     8      RSSI           signed, dBm
 ///   5     16     Ranking Value  signed
-class GSMSet final : public Base {
+class GSMSet final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "GSM Set"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    GSMSet();
 };
 
 } // namespace pallax

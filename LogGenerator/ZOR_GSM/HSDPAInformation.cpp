@@ -1,18 +1,10 @@
 #include "LogGenerator/ZOR_GSM/HSDPAInformation.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "LogGenerator/Records/EntryList.h"
-#include "platform/SystemLog.h"
-
 #include <array>
 
 namespace pallax {
 
 namespace {
-
-constexpr LogCode kHarqLogCode = 0x4221;
-constexpr auto kLogCodes = std::to_array<LogCode>({kHarqLogCode});
-constexpr std::size_t kMinimumLength = 18;
 
 constexpr auto kCarriers = std::to_array<std::string_view>({
     "Single Carrier",
@@ -23,82 +15,66 @@ constexpr auto kCarriers = std::to_array<std::string_view>({
 static_assert(kCarriers.size() == 4);
 
 constexpr auto kFields = std::to_array<Field>({
-    {"Version", u8At(13), Conversion::number(kUnsignedDecimal)},
-    {"Sub Frames", bitsAt(14, 0, 10), Conversion::number(kUnsignedDecimal)},
-    {"Carrier Info", bitsAt(15, 2, 2), Conversion::label(kCarriers)},
+    {"Version", u8At(13), Conversion::number(kUnsignedDecimal),
+     "Version of the log record's layout."},
+    {"Sub Frames", bitsAt(14, 0, 10), Conversion::number(kUnsignedDecimal),
+     "Number of sub-frames that the statistics are over."},
+    {"Carrier Info", bitsAt(15, 2, 2), Conversion::label(kCarriers),
+     "Whether one carrier, two, or MIMO is in use."},
 });
 
 constexpr auto kProcessFields = std::to_array<Field>({
-    {"Process ID", u8At(0), Conversion::number(kUnsignedDecimal)},
-    {"No Rx Bits", u32At(1), Conversion::number(kUnsignedDecimal)},
-    {"New Tx", u16At(5), Conversion::number(kUnsignedDecimal)},
-    {"Block Errors", u16At(7), Conversion::number(kUnsignedDecimal)},
+    Field{"Process ID", u8At(0), Conversion::number(kUnsignedDecimal),
+          "Number of the HARQ process."}
+        .identifying(),
+    {"No Rx Bits", u32At(1), Conversion::number(kUnsignedDecimal), "Number of bits received."},
+    {"New Tx", u16At(5), Conversion::number(kUnsignedDecimal),
+     "Number of new transmissions, as opposed to repetitions."},
+    {"Block Errors", u16At(7), Conversion::number(kUnsignedDecimal), "Number of block errors."},
 });
 
-constexpr std::string_view kPrimaryKey = "Primary HARQ Process";
-constexpr std::string_view kSecondaryKey = "Secondary HARQ Process";
-constexpr std::size_t kPrimaryCountOffset = 16;
-constexpr std::size_t kSecondaryCountOffset = 17;
-constexpr std::size_t kProcessesStart = 18;
-constexpr std::size_t kProcessLength = 9;
+constexpr Position kPrimaryCount = u8At(16);
+constexpr EntryList::Layout kProcesses{.start = 18, .stride = 9, .bytesRead = 9};
 /// By which each primary process moves the secondary ones.
 constexpr std::size_t kPrimaryStride = 162;
 
-Array processesOf(const LogRecord& record, std::size_t start, std::size_t count) {
-    const EntryList processes(record, {start, kProcessLength, kProcessLength}, count);
-    return processes.map([](const LogRecord& process, std::size_t /*index*/) {
-        return entryOf(kProcessFields, process);
-    });
-}
+constexpr auto kLists = std::to_array<ListLayout>({
+    {
+        .key = "Primary HARQ Process",
+        .entries = {kProcesses},
+        .count = kPrimaryCount,
+        .fields = kProcessFields,
+        .meaning = "The HARQ processes of the primary carrier or stream.",
+        .staysWithoutEntries = true,
+    },
+    {
+        .key = "Secondary HARQ Process",
+        .entries = {kProcesses, EntryRun::Move{kPrimaryStride, kPrimaryCount}},
+        .count = u8At(17),
+        .fields = kProcessFields,
+        .meaning = "The HARQ processes of the secondary carrier or stream.",
+        .staysWithoutEntries = true,
+    },
+});
+
+constexpr auto kCodes = std::to_array<CodeLayout>({{
+    .logCode = 0x4221,
+    .name = "HARQ processes of HSDPA",
+    .minimumLength = 18,
+    .fields = kFields,
+    .lists = kLists,
+}});
+
+constexpr RecordLayout kLayout{
+    .section = "HSDPA Info",
+    .logLine = "HSDPA Info",
+    .meaning = "HARQ statistics of the high-speed downlink.",
+    .codes = kCodes,
+    .reportsOtherCodes = false,
+};
 
 } // namespace
 
-std::span<const LogCode> HSDPAInformation::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void HSDPAInformation::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "HSDPA Info");
-    if (logCode != kHarqLogCode || !record.has(kMinimumLength)) {
-        return; // another code is no error to this record
-    }
-    show(kFields, record);
-    const std::size_t primaryCount = record.u8(kPrimaryCountOffset);
-    if (primaryCount != 0) {
-        show(kPrimaryKey, processesOf(record, kProcessesStart, primaryCount));
-    }
-    const std::size_t secondaryCount = record.u8(kSecondaryCountOffset);
-    if (secondaryCount == 0) {
-        return;
-    }
-    show(kSecondaryKey,
-         processesOf(record, kProcessesStart + kPrimaryStride * primaryCount, secondaryCount));
-}
-
-bool HSDPAInformation::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return logCode == kHarqLogCode && record.has(kMinimumLength);
-}
-
-unsigned HSDPAInformation::kindOf(const LogRecord& record) const {
-    constexpr unsigned kSetsPrimary = 1;
-    constexpr unsigned kSetsSecondary = 2;
-    return (record.u8(kPrimaryCountOffset) != 0 ? kSetsPrimary : 0) |
-           (record.u8(kSecondaryCountOffset) != 0 ? kSetsSecondary : 0);
-}
-
-RecordDescription HSDPAInformation::describe() const {
-    const EntryList::Layout processes{kProcessesStart, kProcessLength, kProcessLength};
-    ListDescription primary =
-        describeList(kPrimaryKey, processes, u8At(kPrimaryCountOffset), kProcessFields);
-    primary.staysWithoutEntries = true;
-    ListDescription secondary =
-        describeList(kSecondaryKey, processes, u8At(kSecondaryCountOffset), kProcessFields);
-    secondary.staysWithoutEntries = true;
-    secondary.entries.move = EntryRun::Move{kPrimaryStride, u8At(kPrimaryCountOffset)};
-    CodeDescription code{kHarqLogCode, kMinimumLength};
-    code.fields = describeFields(kFields);
-    code.lists = {std::move(primary), std::move(secondary)};
-    return {std::move(code)};
-}
+HSDPAInformation::HSDPAInformation() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -24,15 +24,9 @@ namespace pallax {
 ///   1     32     No Rx Bits    number
 ///   5     16     New Tx        number
 ///   7     16     Block Errors  number
-class HSDPAInformation final : public Base {
+class HSDPAInformation final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "HSDPA Info"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    /// A list without entries is not set.
-    unsigned kindOf(const LogRecord& record) const override;
-    RecordDescription describe() const override;
+    HSDPAInformation();
 };
 
 } // namespace pallax

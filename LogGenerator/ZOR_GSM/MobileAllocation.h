@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -13,13 +13,9 @@ namespace pallax {
 ///   15    16     ARFCNs    array of numbers, one for each channel
 ///
 /// The array is a new one after each record.
-class MobileAllocation final : public Base {
+class MobileAllocation final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Mobile Allocation"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    MobileAllocation();
 };
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/FieldGroup.h"
+#include "LogGenerator/Records/Layout.h"
 
 #include <array>
 #include <cstddef>
@@ -17,7 +17,6 @@ inline constexpr LogCode kRegistrationLogCode = 0x7132;
 /// Asked of every state record, also where fewer bytes are read.
 inline constexpr std::size_t kStateRecordLength = 16;
 
-inline constexpr std::string_view kServiceStateKey = "MM Service State";
 inline constexpr std::string_view kMMStateKey = "MM State";
 inline constexpr std::string_view kMMSubStateKey = "MM Sub State";
 
@@ -63,10 +62,18 @@ inline constexpr auto kMMStates = std::to_array<std::string_view>({
 });
 static_assert(kMMStates.size() == 26);
 
+/// Of two of them.
+inline constexpr Field kMMStateField{kMMStateKey, u8At(13), Conversion::label(kMMStates),
+                                     "State of the mobility management entity (MM)."};
+
 inline constexpr auto kRegistrationFields = std::to_array<Field>({
-    {kServiceStateKey, u8At(13), Conversion::label(kRegistrationStates)},
+    {"MM Service State", u8At(13), Conversion::label(kRegistrationStates),
+     "State of the registration."},
 });
-inline constexpr FieldGroup kRegistrationGroup{kRegistrationLogCode, kStateRecordLength,
-                                               kRegistrationFields};
+inline constexpr CodeLayout kRegistrationCode{
+    .logCode = kRegistrationLogCode,
+    .minimumLength = kStateRecordLength,
+    .fields = kRegistrationFields,
+};
 
 } // namespace pallax

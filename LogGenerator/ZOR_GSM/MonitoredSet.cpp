@@ -1,11 +1,21 @@
 #include "LogGenerator/ZOR_GSM/MonitoredSet.h"
 
+#include "LogGenerator/ZOR_GSM/SearcherRecord.h"
+
 namespace pallax {
 
-MonitoredSet::MonitoredSet() : SearcherSet("MonitoredSet") {}
+namespace {
 
-std::string_view MonitoredSet::getSectionName() const {
-    return "Monitored Set";
-}
+constexpr RecordLayout kLayout{
+    .section = "Monitored Set",
+    .logLine = "MonitoredSet",
+    .kind = SectionKind::List,
+    .meaning = "The UMTS cells that the network lets the phone measure; the list is always empty.",
+    .codes = kEmptiedSetCodes,
+};
+
+} // namespace
+
+MonitoredSet::MonitoredSet() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,145 +1,114 @@
 #include "LogGenerator/ZOR_GSM/NeighboringCells.h"
 
 #include "LogGenerator/Common/CellMonitor.h"
-#include "LogGenerator/Records/Description.h"
-#include "LogGenerator/Records/EntryList.h"
 #include "LogGenerator/ZOR_GSM/SharedLogCodes.h"
-#include "platform/SystemLog.h"
 #include "platform/TelephonyConstants.h"
+
+#include <array>
 
 namespace pallax {
 
 namespace {
 
-constexpr LogCode kBsicListLogCode = 0x51FF;
-constexpr auto kLogCodes =
-    std::to_array<LogCode>({kMeasurementLogCode, kBsicListLogCode, kCellMonitorLogCode});
-
-constexpr std::size_t kNeighbourCountOffset = 28;
-constexpr EntryList::Layout kNeighbours{.start = 29, .stride = 14, .bytesRead = 7};
-
-constexpr std::size_t kBsicListMinimumLength = 15;
-constexpr std::size_t kBsicCountOffset = 14;
-constexpr EntryList::Layout kBsics{.start = 15, .stride = 4, .bytesRead = 3};
-constexpr std::size_t kArfcnInEntry = 0;
-constexpr std::size_t kBsicInEntry = 2;
-
+constexpr Position kArfcn = u16At(0);
 constexpr std::string_view kARFCNKey = "ARFCN";
 constexpr std::string_view kRSSIKey = "RSSI";
 constexpr std::string_view kBSICKey = "BSIC";
 
+/// What the last list of identity codes told for the neighbour's ARFCN.
+PropertyList bsicOf(const Place& place) {
+    const auto& remembered = place.memory->remembered;
+    const auto bsic = remembered.find(place.here.read(kArfcn));
+    return bsic != remembered.end() ? PropertyList(DisplayNumber(bsic->second, kDecimal))
+                                    : PropertyList();
+}
+
+constexpr auto kReadForBsic = std::to_array<Extent>({extentOf(kArfcn)});
+constexpr Computation kBsic{
+    .name = "bsic",
+    .formula = "what the last record 0x51FF told for the ARFCN; no key if nothing",
+    .read = kReadForBsic,
+    .compute = bsicOf,
+};
+
 constexpr auto kNeighbourFields = std::to_array<Field>({
-    {kARFCNKey, u16At(kArfcnInEntry), Conversion::number()},
-    {kRSSIKey, u8At(2), Conversion::number()},
-    {"C1 Value", s32At(3), Conversion::number()},
+    Field{kARFCNKey, kArfcn, Conversion::number(), "ARFCN of the neighbour's BCCH carrier."}
+        .identifying(),
+    {kRSSIKey, u8At(2), Conversion::number(),
+     "Receive level of the neighbour: as the modem counts it, or in dBm from the cell monitor."},
+    {"C1 Value", s32At(3), Conversion::number(), "Path loss criterion C1 of the neighbour."},
+    computed(kBSICKey, kDecimal, kBsic,
+             "Base station identity code of the neighbour, where it is known.")
+        .identifying(),
 });
 
-constexpr auto kCellNumbers = std::to_array<CellNumber>({
-    {kARFCNKey, kHXCellMonitorARFCN, "NeighboringCells: Failed to retrieve ARFCN\n"},
+constexpr auto kNeighbours = std::to_array<ListLayout>({{
+    .entries = {{.start = 29, .stride = 14, .bytesRead = 7}},
+    .count = u8At(28),
+    .fields = kNeighbourFields,
+}});
+
+constexpr auto kBsicFields = std::to_array<Field>({
+    Field{kARFCNKey, kArfcn, Conversion::number()}.identifying(),
+    {kBSICKey, u8At(2), Conversion::number()},
 });
+
+constexpr auto kBsics = std::to_array<ListLayout>({{
+    .entries = {{.start = 15, .stride = 4, .bytesRead = 3}},
+    .count = u8At(14),
+    .fields = kBsicFields,
+    .isShown = false,
+    .rememberedAs = "bsic",
+}});
 
 /// The cell monitor counts levels in steps of this many dBm.
-constexpr int kRssiStepDbm = 2;
-constexpr auto kCellLevels = std::to_array<CellLevel>({
-    {kRSSIKey, kHXCellMonitorRSSI, "NeighboringCells: Failed to retrieve RSSI\n", &kDecimalDbm,
-     kRssiStepDbm},
+constexpr double kRssiStepDbm = 2.0;
+constexpr auto kCellFields = std::to_array<Field>({
+    cellNumber(kARFCNKey, kHXCellMonitorARFCN, "NeighboringCells: Failed to retrieve ARFCN\n")
+        .identifying(),
+    cellLevel(kRSSIKey, kHXCellMonitorRSSI, "NeighboringCells: Failed to retrieve RSSI\n",
+              kDecimalDbm, kRssiStepDbm),
 });
+constexpr auto kTechnologies =
+    std::to_array<std::string_view>({kHXCellMonitorRadioAccessTechnologyGSM});
+constexpr ListPart kNeighbourCells{
+    .kind = ListPart::Kind::CellEntries,
+    .parse = parseCellMonitorArray,
+    .technologies = kTechnologies,
+    .cellType = kHXCellMonitorCellTypeNeighbor,
+};
+
+constexpr auto kCodes = std::to_array<CodeLayout>({
+    {
+        .logCode = kMeasurementLogCode,
+        .minimumLength = kMeasurementLength,
+        .lists = kNeighbours,
+    },
+    {
+        .logCode = 0x51FF,
+        .name = "Identity codes of the GSM neighbours",
+        .minimumLength = 15,
+        .lists = kBsics,
+        .note = "Remembered for the lists to come; shows nothing itself.",
+    },
+    {
+        .logCode = kCellMonitorLogCode,
+        .fields = kCellFields,
+        .listPart = &kNeighbourCells,
+        .note = kLevelsNote,
+    },
+});
+
+constexpr RecordLayout kLayout{
+    .section = "Neighboring Cells",
+    .logLine = "NeighboringCells",
+    .kind = SectionKind::List,
+    .meaning = "The GSM neighbours.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> NeighboringCells::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void NeighboringCells::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "NeighboringCells");
-    switch (logCode) {
-    case kMeasurementLogCode:
-        showMeasuredCells(record);
-        break;
-    case kBsicListLogCode:
-        rememberBsics(record);
-        break;
-    case kCellMonitorLogCode:
-        showMonitoredCells(record);
-        break;
-    default:
-        logUnknown(logCode);
-        break;
-    }
-}
-
-bool NeighboringCells::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return logCode == kMeasurementLogCode && record.has(kMeasurementLength);
-}
-
-void NeighboringCells::showMeasuredCells(const LogRecord& record) {
-    if (!record.has(kMeasurementLength)) {
-        return;
-    }
-    clearList();
-    const EntryList neighbours(record, kNeighbours, record.u8(kNeighbourCountOffset));
-    if (neighbours.count() != 0) {
-        replaceList(neighbours, [this](Dictionary& cell, const LogRecord& entry) {
-            fillMeasuredCell(cell, entry);
-        });
-    }
-}
-
-void NeighboringCells::fillMeasuredCell(Dictionary& cell, const LogRecord& entry) const {
-    fillEntry(cell, kNeighbourFields, entry);
-    const auto bsic = arfcnToBsic.find(entry.u16(kArfcnInEntry));
-    if (bsic != arfcnToBsic.end()) {
-        cell.setFixed(kBSICKey, DisplayNumber(std::int64_t{bsic->second}, kDecimal));
-    }
-}
-
-void NeighboringCells::rememberBsics(const LogRecord& record) {
-    if (!record.has(kBsicListMinimumLength)) {
-        return;
-    }
-    arfcnToBsic.clear(); // also when the new list is empty
-    const EntryList bsics(record, kBsics, record.u8(kBsicCountOffset));
-    const std::size_t whole = bsics.wholeCount();
-    for (std::size_t index = 0; index < whole; ++index) {
-        const LogRecord entry = bsics.at(index);
-        arfcnToBsic.insert_or_assign(entry.u16(kArfcnInEntry), entry.u8(kBsicInEntry));
-    }
-}
-
-void NeighboringCells::showMonitoredCells(const LogRecord& record) {
-    clearList(); // what cannot be read leaves the list empty
-    if (const std::optional<Array> cells = cellMonitorArrayOrLog(record)) {
-        replaceList(cellEntries(*cells, kHXCellMonitorRadioAccessTechnologyGSM,
-                                kHXCellMonitorCellTypeNeighbor, kCellNumbers, kCellLevels));
-    }
-}
-
-RecordDescription NeighboringCells::describe() const {
-    ListDescription neighbours =
-        describeList("", kNeighbours, u8At(kNeighbourCountOffset), kNeighbourFields);
-    neighbours.fields.push_back(
-        describeComputed(kBSICKey, kDecimal, "bsic",
-                         "what the last record 0x51FF told for the ARFCN; no key if nothing",
-                         {extentOf(u16At(kArfcnInEntry))}));
-    CodeDescription measured{kMeasurementLogCode, kMeasurementLength};
-    measured.lists = {std::move(neighbours)};
-
-    const auto told = std::to_array<Field>({
-        {kARFCNKey, u16At(kArfcnInEntry), Conversion::number()},
-        {kBSICKey, u8At(kBsicInEntry), Conversion::number()},
-    });
-    CodeDescription bsics{kBsicListLogCode, kBsicListMinimumLength};
-    bsics.lists = {describeList("", kBsics, u8At(kBsicCountOffset), told)};
-    bsics.lists.front().isShown = false;
-    bsics.lists.front().rememberedAs = "bsic";
-    bsics.note = "Remembered for the lists to come; shows nothing itself.";
-
-    CodeDescription monitored = describeCells(ListPartDescription{ListPartDescription::Kind::CellEntries,
-                                                       {kHXCellMonitorRadioAccessTechnologyGSM},
-                                                       kHXCellMonitorCellTypeNeighbor},
-                                              kCellNumbers, kCellLevels);
-    return {std::move(measured), std::move(bsics), std::move(monitored)};
-}
+NeighboringCells::NeighboringCells() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,9 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
-
-#include <cstdint>
-#include <unordered_map>
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -36,22 +33,9 @@ namespace pallax {
 ///   kHXCellMonitorRSSI     RSSI     low 16 bits, signed, x 2, dBm; empty for 32767
 ///
 /// Whichever of 0x5137 and 0xFF0001 came last makes the list.
-class NeighboringCells final : public Base {
+class NeighboringCells final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Neighboring Cells"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
-
-private:
-    void showMeasuredCells(const LogRecord& record);
-    void rememberBsics(const LogRecord& record);
-    void showMonitoredCells(const LogRecord& record);
-    void fillMeasuredCell(Dictionary& cell, const LogRecord& entry) const;
-
-    std::unordered_map<std::uint16_t, std::uint8_t> arfcnToBsic;
+    NeighboringCells();
 };
 
 } // namespace pallax

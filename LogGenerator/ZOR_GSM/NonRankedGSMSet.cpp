@@ -1,16 +1,19 @@
 #include "LogGenerator/ZOR_GSM/NonRankedGSMSet.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
-
 namespace pallax {
 
-void NonRankedGSMSet::updateWithData(const LogRecord& /*record*/, LogCode /*logCode*/) {
-    systemLog(LogPriority::Warning, "NonRankedGSMSet");
-}
+namespace {
 
-RecordDescription NonRankedGSMSet::describe() const {
-    return {};
-}
+constexpr RecordLayout kLayout{
+    .section = "Non-Ranked GSM Set",
+    .logLine = "NonRankedGSMSet",
+    .kind = SectionKind::List,
+    .meaning = "The GSM cells that are not ranked; no log code is known to carry them.",
+    .reportsOtherCodes = false,
+};
+
+} // namespace
+
+NonRankedGSMSet::NonRankedGSMSet() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

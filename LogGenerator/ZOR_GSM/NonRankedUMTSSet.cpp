@@ -1,16 +1,19 @@
 #include "LogGenerator/ZOR_GSM/NonRankedUMTSSet.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
-
 namespace pallax {
 
-void NonRankedUMTSSet::updateWithData(const LogRecord& /*record*/, LogCode /*logCode*/) {
-    systemLog(LogPriority::Warning, "NonRankedUMTSSet");
-}
+namespace {
 
-RecordDescription NonRankedUMTSSet::describe() const {
-    return {};
-}
+constexpr RecordLayout kLayout{
+    .section = "Non-Ranked UMTS Set",
+    .logLine = "NonRankedUMTSSet",
+    .kind = SectionKind::List,
+    .meaning = "The UMTS cells that are not ranked; no log code is known to carry them.",
+    .reportsOtherCodes = false,
+};
+
+} // namespace
+
+NonRankedUMTSSet::NonRankedUMTSSet() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

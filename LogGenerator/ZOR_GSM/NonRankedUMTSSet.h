@@ -1,18 +1,14 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
 /// The UMTS cells that are not ranked, section "Non-Ranked UMTS Set". No log code is known to carry
 /// them: the section shows, and stays empty.
-class NonRankedUMTSSet final : public Base {
+class NonRankedUMTSSet final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Non-Ranked UMTS Set"; }
-    std::span<const LogCode> getLogCodeArray() const override { return {}; }
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    RecordDescription describe() const override;
+    NonRankedUMTSSet();
 };
 
 } // namespace pallax

@@ -1,40 +1,34 @@
 #include "LogGenerator/ZOR_GSM/ProcessCO.h"
 
-#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/MobilityStates.h"
-#include "platform/SystemLog.h"
 
 namespace pallax {
 
 namespace {
 
 constexpr auto kStateFields = std::to_array<Field>({
-    {kMMStateKey, u8At(13), Conversion::label(kMMStates)},
+    kMMStateField,
 });
 
-constexpr auto kGroups = std::to_array<FieldGroup>({
-    {kMMStateLogCode, kStateRecordLength, kStateFields},
-    kRegistrationGroup,
+constexpr auto kCodes = std::to_array<CodeLayout>({
+    {
+        .logCode = kMMStateLogCode,
+        .minimumLength = kStateRecordLength,
+        .fields = kStateFields,
+    },
+    kRegistrationCode,
 });
-constexpr auto kLogCodes = logCodesOf(kGroups);
+
+constexpr RecordLayout kLayout{
+    .section = "Process CO",
+    .logLine = "ProcessCS", // the line of its sibling, on purpose
+    .meaning = "Registration and mobility management as Process CS shows them, without sub-state "
+               "and cause.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> ProcessCO::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void ProcessCO::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "ProcessCS"); // the line of its sibling, on purpose
-    showGroup(kGroups, record, logCode);
-}
-
-bool ProcessCO::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return isOfGroup(kGroups, record, logCode);
-}
-
-RecordDescription ProcessCO::describe() const {
-    return describeGroups(kGroups);
-}
+ProcessCO::ProcessCO() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

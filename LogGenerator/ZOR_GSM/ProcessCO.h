@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -14,13 +14,9 @@ namespace pallax {
 ///   0x7131, at least 16 bytes
 ///   byte  width  key                 shown as
 ///   13    8      MM State            label (kMMStates), "Unknown" beyond
-class ProcessCO final : public Base {
+class ProcessCO final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Process CO"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    ProcessCO();
 };
 
 } // namespace pallax

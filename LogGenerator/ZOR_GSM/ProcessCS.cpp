@@ -1,8 +1,6 @@
 #include "LogGenerator/ZOR_GSM/ProcessCS.h"
 
-#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/MobilityStates.h"
-#include "platform/SystemLog.h"
 
 namespace pallax {
 
@@ -30,34 +28,32 @@ constexpr auto kRejectCauses = std::to_array<std::string_view>({
 static_assert(kRejectCauses.size() == 4);
 
 constexpr auto kStateFields = std::to_array<Field>({
-    {kMMStateKey, u8At(13), Conversion::label(kMMStates)},
-    {kMMSubStateKey, u8At(14), Conversion::label(kSubStates)},
-    {"LU Reject Cause", u8At(15), Conversion::label(kRejectCauses)},
+    kMMStateField,
+    {kMMSubStateKey, u8At(14), Conversion::label(kSubStates),
+     "Sub-state of the mobility management entity."},
+    {"LU Reject Cause", u8At(15), Conversion::label(kRejectCauses),
+     "Update status: how the last location update ended."},
 });
 
-constexpr auto kGroups = std::to_array<FieldGroup>({
-    {kMMStateLogCode, kStateRecordLength, kStateFields},
-    kRegistrationGroup,
+constexpr auto kCodes = std::to_array<CodeLayout>({
+    {
+        .logCode = kMMStateLogCode,
+        .name = "State of mobility management",
+        .minimumLength = kStateRecordLength,
+        .fields = kStateFields,
+    },
+    kRegistrationCode,
 });
-constexpr auto kLogCodes = logCodesOf(kGroups);
+
+constexpr RecordLayout kLayout{
+    .section = "Process CS",
+    .logLine = "ProcessCS",
+    .meaning = "State of the mobility management of the circuit-switched domain.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> ProcessCS::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void ProcessCS::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "ProcessCS");
-    showGroup(kGroups, record, logCode);
-}
-
-bool ProcessCS::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return isOfGroup(kGroups, record, logCode);
-}
-
-RecordDescription ProcessCS::describe() const {
-    return describeGroups(kGroups);
-}
+ProcessCS::ProcessCS() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

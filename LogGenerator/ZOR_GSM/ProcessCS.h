@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -15,13 +15,9 @@ namespace pallax {
 ///   13    8      MM State            label (kMMStates), "Unknown" beyond
 ///   14    8      MM Sub State        label (kSubStates), "Unknown" beyond
 ///   15    8      LU Reject Cause     label (kRejectCauses), "Unknown" beyond
-class ProcessCS final : public Base {
+class ProcessCS final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Process CS"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
+    ProcessCS();
 };
 
 } // namespace pallax

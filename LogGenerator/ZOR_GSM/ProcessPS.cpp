@@ -1,8 +1,6 @@
 #include "LogGenerator/ZOR_GSM/ProcessPS.h"
 
-#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/ZOR_GSM/MobilityStates.h"
-#include "platform/SystemLog.h"
 
 namespace pallax {
 
@@ -45,34 +43,33 @@ constexpr auto kRejectCauses = std::to_array<std::string_view>({
 static_assert(kRejectCauses.size() == 4);
 
 constexpr auto kStateFields = std::to_array<Field>({
-    {kMMStateKey, u8At(13), Conversion::label(kGMMStates)},
-    {kMMSubStateKey, u8At(14), Conversion::label(kGMMSubStates)},
-    {"Attach Reject Cause", u8At(15), Conversion::label(kRejectCauses)},
+    {kMMStateKey, u8At(13), Conversion::label(kGMMStates),
+     "State of the GPRS mobility management entity (GMM)."},
+    {kMMSubStateKey, u8At(14), Conversion::label(kGMMSubStates),
+     "Sub-state of the GPRS mobility management entity."},
+    {"Attach Reject Cause", u8At(15), Conversion::label(kRejectCauses),
+     "GPRS update status: how the last attach or routing area update ended."},
 });
 
-constexpr auto kGroups = std::to_array<FieldGroup>({
-    {kGMMStateLogCode, kStateRecordLength, kStateFields},
-    kRegistrationGroup,
+constexpr auto kCodes = std::to_array<CodeLayout>({
+    {
+        .logCode = kGMMStateLogCode,
+        .name = "State of GPRS mobility management",
+        .minimumLength = kStateRecordLength,
+        .fields = kStateFields,
+    },
+    kRegistrationCode,
 });
-constexpr auto kLogCodes = logCodesOf(kGroups);
+
+constexpr RecordLayout kLayout{
+    .section = "Process PS",
+    .logLine = "ProcessPS",
+    .meaning = "State of the mobility management of the packet-switched domain.",
+    .codes = kCodes,
+};
 
 } // namespace
 
-std::span<const LogCode> ProcessPS::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void ProcessPS::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "ProcessPS");
-    showGroup(kGroups, record, logCode);
-}
-
-bool ProcessPS::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return isOfGroup(kGroups, record, logCode);
-}
-
-RecordDescription ProcessPS::describe() const {
-    return describeGroups(kGroups);
-}
+ProcessPS::ProcessPS() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -30,16 +30,9 @@ namespace pallax {
 ///
 /// Digits above 9 show as a blank: a two-digit network code ends in one when it comes from 0x7135,
 /// and does not when it comes from the cell monitor.
-class ServingPLMN final : public Base {
+class ServingPLMN final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "Serving PLMN"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    RecordDescription describe() const override;
-
-private:
-    void showNetwork(const LogRecord& record);
-    void showServingCell(const LogRecord& record);
+    ServingPLMN();
 };
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -33,19 +33,9 @@ namespace pallax {
 ///   kHXCellMonitorCellId  Cell ID          number
 ///   kHXCellMonitorUARFCN  UARFCN           number
 ///   kHXCellMonitorSCN     Scrambling Code  number
-class UMTSRRInfo final : public Base {
+class UMTSRRInfo final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "UMTS RR Info"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    RecordDescription describe() const override;
-
-private:
-    void updateState(const LogRecord& record);
-    void updateIdentity(const LogRecord& record);
-    void updateCiphering(const LogRecord& record);
-    void updateTransmitPower(const LogRecord& record);
-    void updateFromCellMonitor(const LogRecord& record);
+    UMTSRRInfo();
 };
 
 } // namespace pallax

@@ -1,16 +1,18 @@
 #include "LogGenerator/ZOR_GSM/UMTSRRMeasurement.h"
 
-#include "LogGenerator/Records/Description.h"
-#include "platform/SystemLog.h"
-
 namespace pallax {
 
-void UMTSRRMeasurement::updateWithData(const LogRecord& /*record*/, LogCode /*logCode*/) {
-    systemLog(LogPriority::Warning, "UMTSRRMeasurement");
-}
+namespace {
 
-RecordDescription UMTSRRMeasurement::describe() const {
-    return {};
-}
+constexpr RecordLayout kLayout{
+    .section = "UMTS RR Measurement",
+    .logLine = "UMTSRRMeasurement",
+    .meaning = "Measurements of the UMTS radio resource layer; no log code is known to carry them.",
+    .reportsOtherCodes = false,
+};
+
+} // namespace
+
+UMTSRRMeasurement::UMTSRRMeasurement() : LayoutRecord(kLayout) {}
 
 } // namespace pallax

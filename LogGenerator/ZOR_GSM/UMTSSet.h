@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -27,18 +27,9 @@ namespace pallax {
 ///   kHXCellMonitorSCN     Scrambling Code  number
 ///   kHXCellMonitorRSCP    RSCP             low 16 bits, signed, dBm; empty for 32767
 ///   kHXCellMonitorECN0    Energy Per Chip  low 16 bits, signed, dB; empty for 32767
-class UMTSSet final : public Base {
+class UMTSSet final : public LayoutRecord {
 public:
-    std::string_view getSectionName() const override { return "UMTS Set"; }
-    std::span<const LogCode> getLogCodeArray() const override;
-    SectionKind sectionKind() const override { return SectionKind::List; }
-    void updateWithData(const LogRecord& record, LogCode logCode) override;
-    bool replacesShown(const LogRecord& record, LogCode logCode) const override;
-    RecordDescription describe() const override;
-
-private:
-    void updateFromRanking(const LogRecord& record);
-    void updateFromCellMonitor(const LogRecord& record);
+    UMTSSet();
 };
 
 } // namespace pallax

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/ZOR_GSM/SearcherSet.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 
 namespace pallax {
 
@@ -10,10 +10,9 @@ namespace pallax {
 ///   0x417A, at least 16 bytes
 ///   byte  width  field
 ///   15    8      cell count; no cell is shown
-class VirtualActiveSet final : public SearcherSet {
+class VirtualActiveSet final : public LayoutRecord {
 public:
     VirtualActiveSet();
-    std::string_view getSectionName() const override;
 };
 
 } // namespace pallax
