@@ -46,24 +46,16 @@ constexpr Field cellLevel(std::string_view key, std::string_view cellKey, std::s
     return field;
 }
 
+// For records without a layout.
+
 /// The array's elements; none when the root is no array. Nothing, with "Cell Info Array data could
 /// not be constructed" in the log, when the payload is no property list.
 std::optional<Array> readCellMonitorArray(const LogRecord& record);
-
-/// "Failed to get Cell Array\n": the second line of most records whose array could not be read.
-void logNoCellArray();
-
-/// The same for a record whose second line that is: both are logged.
-std::optional<Array> cellMonitorArrayOrLog(const LogRecord& record);
 
 /// True for a cell of that radio access technology and cell type; an element that lacks either
 /// key, or is no dictionary, is none.
 bool isCell(const PropertyList& element, std::string_view radioAccessTechnology,
             std::string_view cellType);
-
-/// The first such cell, or null.
-const PropertyList* findCell(const Array& cells, std::string_view radioAccessTechnology,
-                             std::string_view cellType);
 
 /// The cell's number under `key` as a signed 32-bit integer. Nothing, with `failure` in the log at
 /// error priority, when it is missing or no such number.
@@ -83,32 +75,7 @@ struct CellNumber {
 void showCellNumbers(const DictionaryRef& target, std::span<const CellNumber> numbers,
                      const PropertyList& cell);
 
-/// A level as the cell monitor reports it: the low 16 bits, signed, times `factor`, under
-/// `format`; the empty string for 32767, which stands for "not measured".
-PropertyList cellLevel(std::int32_t number, const NumberFormat& format, int factor = 1);
-
-/// One display key that shows a cell's number as a level, and the line that is logged when the
-/// cell has none. The format must live as long as the program.
-struct CellLevel {
-    std::string_view key;
-    std::string_view cellKey;
-    std::string_view failure;
-    const NumberFormat* format;
-    int factor = 1;
-};
-
-/// Sets the key of every level that the cell has, as `showCellNumbers` does.
-void showCellLevels(const DictionaryRef& target, std::span<const CellLevel> levels,
-                    const PropertyList& cell);
-
-/// A dictionary for every cell of that radio access technology and cell type, in order, with its
-/// numbers and behind them its levels; also for a cell that has none of them.
-Array cellEntries(const Array& cells, std::string_view radioAccessTechnology,
-                  std::string_view cellType, std::span<const CellNumber> numbers,
-                  std::span<const CellLevel> levels);
-
-/// What `showCellNumbers` and `showCellLevels` show of that part of the array.
-CodeDescription describeCells(ListPartDescription part, std::span<const CellNumber> numbers,
-                              std::span<const CellLevel> levels);
+/// What `showCellNumbers` shows of that part of the array.
+CodeDescription describeCells(ListPartDescription part, std::span<const CellNumber> numbers);
 
 } // namespace pallax

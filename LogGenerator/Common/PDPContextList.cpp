@@ -32,7 +32,7 @@ constexpr RecordLayout kLayout{
     .section = "PDP Context Info",
     .logLine = "PDPContextList",
     .kind = SectionKind::List,
-    .meaning = "The contexts of packet data, each as the telephony service describes it.",
+    .meaning = "The packet data contexts, each as the telephony service describes it.",
     .codes = kCodes,
     .readsOtherCodes = true,
 };

@@ -35,7 +35,7 @@ constexpr auto kSimFiles = std::to_array<Field>({
     simFile("kSimFile_RATMODE", "EF-RAT MODE", "Radio access technologies that the card prefers."),
     simFile("kSimFile_PNN", "EF-PLMN NETWORK NAME", "Names of networks."),
     simFile("kSimFile_OPL", "EF-OPERATOR PLMN LIST",
-            "For which networks and areas the names of EF-PNN hold."),
+            "Networks and areas to which the names in EF-PNN apply."),
     simFile("kSimFile_OPLMNAcT", "EF-OPLMNAcT",
             "Networks that the operator prefers, with their access technologies."),
 });
@@ -61,7 +61,7 @@ constexpr auto kCodes = std::to_array<CodeLayout>({{
 constexpr RecordLayout kLayout{
     .section = "SIM Info",
     .logLine = "SimInfo",
-    .meaning = "Elementary files of the SIM, as the telephony service has read them.",
+    .meaning = "Elementary files of the SIM, as read by the telephony service.",
     .codes = kCodes,
     .reportsOtherCodes = false,
 };

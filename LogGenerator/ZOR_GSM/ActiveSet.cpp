@@ -69,9 +69,9 @@ constexpr auto kCellFields = std::to_array<Field>({
     Field{"Scrambling Code", bitsAt(7, 0, 13), Conversion::number(),
           "Primary scrambling code of the cell."}
         .identifying(),
-    computed("RSCP", kDecimalDb, kRscp,
-             "Received signal code power of the cell's pilot, worked out of receiver gain and "
-             "Ec/Io."),
+    computed(
+        "RSCP", kDecimalDb, kRscp,
+        "Received signal code power of the cell's pilot, computed from receiver gain and Ec/Io."),
     computed("Energy Per Chip", kDecimalDb, kEnergyPerChip,
              "Ec/Io of the cell's pilot: energy per chip over the whole received power."),
 });

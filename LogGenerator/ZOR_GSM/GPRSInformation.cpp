@@ -69,7 +69,7 @@ static_assert(kOperatingModes.size() == 3);
 
 constexpr auto kControlFields = std::to_array<Field>({
     {"Network Control Order", u8At(15), labelByBytePlusOne(kControlOrders),
-     "Who decides about reselection: NC0 the phone, NC1 the phone with reports, NC2 the network."},
+     "Who decides on reselection: NC0 the phone, NC1 the phone with reports, NC2 the network."},
     {"PFC Supported", u8At(13), labelByBytePlusOne(kPFCSupports),
      "Whether the network supports packet flow contexts."},
     {"Priority Access Threshold", u8At(14), labelByBytePlusOne(kAccessThresholds),
@@ -102,10 +102,8 @@ constexpr auto kPacketStatusFields = std::to_array<Field>({
      "Whether the network supports the packet PSI status message, as a number."},
     {"Packet SI Status", u8At(33), Conversion::flag("Supported", "Not Supported"),
      "Whether the network supports the packet SI status message."},
-    {"Count LR", u8At(14), Conversion::number(),
-     "A count of the record: it gives no more than the name."},
-    {"Count HR", u8At(15), Conversion::number(),
-     "A count of the record: it gives no more than the name."},
+    {"Count LR", u8At(14), Conversion::number(), "A count of the record: it gives only the name."},
+    {"Count HR", u8At(15), Conversion::number(), "A count of the record: it gives only the name."},
 });
 
 constexpr auto kSI13Fields = std::to_array<Field>({

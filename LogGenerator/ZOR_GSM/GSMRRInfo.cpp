@@ -53,7 +53,7 @@ constexpr auto kMeasurementFields = std::to_array<Field>({
     {"Rx Quality Full", s32At(16), Conversion::number(),
      "Receive quality over all frames; the record holds C1 in the same place."},
     {"Rx Quality Sub", s32At(20), Conversion::number(),
-     "Receive quality over the frames that are sent in any case; the record holds C2 in the same "
+     "Receive quality over the frames that are always sent; the record holds C2 in the same "
      "place."},
 });
 
@@ -64,7 +64,7 @@ constexpr auto kDtxFields = std::to_array<Field>({
 
 constexpr auto kDrxFields = std::to_array<Field>({
     {"DRX Used", u8At(16), Conversion::number(kSeconds),
-     "Discontinuous reception: the time for which the phone goes on listening."},
+     "Discontinuous reception: how long the phone keeps listening."},
 });
 
 constexpr auto kCodes = std::to_array<CodeLayout>({

@@ -10,7 +10,8 @@ constexpr RecordLayout kLayout{
     .section = "Monitored Set",
     .logLine = "MonitoredSet",
     .kind = SectionKind::List,
-    .meaning = "The UMTS cells that the network lets the phone measure; the list is always empty.",
+    .meaning =
+        "The UMTS cells that the network tells the phone to measure; the list is always empty.",
     .codes = kEmptiedSetCodes,
 };
 

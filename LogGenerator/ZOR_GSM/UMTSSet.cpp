@@ -81,7 +81,7 @@ constexpr RecordLayout kLayout{
     .section = "UMTS Set",
     .logLine = "UMTSSet",
     .kind = SectionKind::List,
-    .meaning = "The UMTS neighbours: ranked for reselection, or of the cell monitor, whichever "
+    .meaning = "The UMTS neighbours: ranked for reselection, or from the cell monitor, whichever "
                "came last.",
     .codes = kCodes,
 };

@@ -1,12 +1,14 @@
 #include "LogGenerator/Common/CellMonitor.h"
 
-#include "LogGenerator/Records/Formats.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 #include "platform/TelephonyConstants.h"
 #include "tests/doubles/CellBuilder.h"
 #include "tests/doubles/PropertyListRecord.h"
 #include "tests/doubles/RecordFixture.h"
 
 #include <gtest/gtest.h>
+
+#include <algorithm>
 
 namespace pallax {
 namespace {
@@ -16,27 +18,68 @@ using Lines = std::vector<RecordingLog::Line>;
 
 constexpr LogCode kCellMonitor = 0xFF0001;
 
-PropertyList servingCell(std::int64_t countryCode) {
-    return Dictionary{
-        {"kHXCellMonitorCellRadioAccessTechnology", "kHXCellMonitorRadioAccessTechnologyGSM"},
-        {"kHXCellMonitorCellType", "kHXCellMonitorCellTypeServing"},
-        {"kHXCellMonitorMCC", PropertyList::integer(countryCode)}};
+constexpr auto kGsm = std::to_array<std::string_view>({kHXCellMonitorRadioAccessTechnologyGSM});
+constexpr auto kGsmAndUmts = std::to_array<std::string_view>(
+    {kHXCellMonitorRadioAccessTechnologyGSM, kHXCellMonitorRadioAccessTechnologyUMTS});
+constexpr ListPart kServingCell{.kind = ListPart::Kind::FirstCell,
+                                .parse = parseCellMonitorArray,
+                                .technologies = kGsm,
+                                .cellType = kHXCellMonitorCellTypeServing};
+constexpr ListPart kNeighbours{.kind = ListPart::Kind::CellEntries,
+                               .parse = parseCellMonitorArray,
+                               .technologies = kGsmAndUmts,
+                               .cellType = kHXCellMonitorCellTypeNeighbor};
+
+constexpr auto kNumberFields = std::to_array<Field>({
+    cellNumber("Second", "b", "no b\n", "The second."),
+    cellNumber("First", "a", "no a\n", "The first."),
+    cellNumber("Third", "c", "no c\n", "The third."),
+});
+constexpr auto kNumberCodes = std::to_array<CodeLayout>(
+    {{.logCode = kCellMonitor, .fields = kNumberFields, .listPart = &kServingCell}});
+constexpr RecordLayout kNumbersLayout{
+    .section = "Numbers", .logLine = "Numbers", .codes = kNumberCodes};
+
+/// Shows three numbers of the first serving cell.
+class Numbers final : public LayoutRecord {
+public:
+    Numbers() : LayoutRecord(kNumbersLayout) {}
+};
+
+constexpr auto kEntryFields = std::to_array<Field>({
+    cellNumber("Channel", kHXCellMonitorARFCN, "no channel\n", "The channel."),
+    cellLevel("Level", kHXCellMonitorRSSI, "no level\n", kDecimalDbm),
+    cellLevel("Doubled", kHXCellMonitorRSCP, "", kDecimalDb, 2.0),
+});
+constexpr auto kEntryCodes = std::to_array<CodeLayout>(
+    {{.logCode = kCellMonitor, .fields = kEntryFields, .listPart = &kNeighbours}});
+constexpr RecordLayout kEntriesLayout{
+    .section = "Entries", .logLine = "Entries", .kind = SectionKind::List, .codes = kEntryCodes};
+
+/// Lists a number and two levels of every neighbour.
+class Entries final : public LayoutRecord {
+public:
+    Entries() : LayoutRecord(kEntriesLayout) {}
+};
+
+PropertyList servingCell(const Dictionary& numbers) {
+    PropertyList serving = cell("GSM", "Serving");
+    for (const Dictionary::Entry& number : numbers) {
+        serving.dictionary()->set(number.key.string(), number.value);
+    }
+    return serving;
 }
 
 /// The array that a record carries, or null when it cannot be read.
 PropertyList cellsOf(const Record& record) {
-    const auto cells = readCellMonitorArray(LogRecord(record.bytes()));
-    return cells ? PropertyList(*cells) : PropertyList();
-}
-
-bool isServingGSM(const PropertyList& element) {
-    return isCell(element, kHXCellMonitorRadioAccessTechnologyGSM, kHXCellMonitorCellTypeServing);
+    const auto cells = parseCellMonitorArray(LogRecord(record.bytes()));
+    return cells ? *cells : PropertyList();
 }
 
 // The array
 
 TEST(CellMonitor, ReadsTheArrayInTheBinaryForm) {
-    const Array cells = {servingCell(310), "no cell"};
+    const Array cells = {servingCell({{"a", PropertyList::integer(310)}}), "no cell"};
     EXPECT_EQ(cellsOf(propertyListRecord(kCellMonitor, cells)), PropertyList(cells));
 }
 
@@ -47,243 +90,263 @@ TEST(CellMonitor, ReadsTheArrayInTheXmlForm) {
                   "<key>kHXCellMonitorCellRadioAccessTechnology</key>"
                   "<string>kHXCellMonitorRadioAccessTechnologyGSM</string>"
                   "<key>kHXCellMonitorCellType</key><string>kHXCellMonitorCellTypeServing</string>"
-                  "<key>kHXCellMonitorMCC</key><integer>310</integer>"
+                  "<key>a</key><integer>310</integer>"
                   "</dict></array></plist>")),
-              PropertyList(Array{servingCell(310)}));
+              PropertyList(Array{servingCell({{"a", PropertyList::integer(310)}})}));
 }
 
 TEST(CellMonitor, ReadsTheArrayInTheTextFormWhoseNumbersAreTexts) {
     const PropertyList cells = cellsOf(textRecord(
         kCellMonitor,
         "( { kHXCellMonitorCellRadioAccessTechnology = kHXCellMonitorRadioAccessTechnologyGSM;"
-        " kHXCellMonitorCellType = kHXCellMonitorCellTypeServing; kHXCellMonitorMCC = 310; } )"));
+        " kHXCellMonitorCellType = kHXCellMonitorCellTypeServing; a = 310; } )"));
     ASSERT_NE(cells.array(), nullptr);
     ASSERT_EQ(cells.array()->size(), 1U);
-    EXPECT_TRUE(isServingGSM(cells.array()->front()));
-    EXPECT_EQ(*cells.array()->front().dictionary()->find("kHXCellMonitorMCC"), PropertyList("310"));
+    EXPECT_TRUE(kServingCell.looksFor(cells.array()->front()));
+    EXPECT_EQ(*cells.array()->front().dictionary()->find("a"), PropertyList("310"));
 }
 
 TEST(CellMonitor, APayloadThatIsNoPropertyListGivesNothingAndIsLogged) {
     for (const std::string_view payload : {"", "( a", "bplist00", "<plist><array>"}) {
         RecordingLog log;
         const Record record = textRecord(kCellMonitor, payload);
-        EXPECT_EQ(readCellMonitorArray(LogRecord(record.bytes())), std::nullopt) << payload;
+        EXPECT_EQ(parseCellMonitorArray(LogRecord(record.bytes())), std::nullopt) << payload;
+        EXPECT_EQ(log.take(), (Lines{{3, "Cell Info Array data could not be constructed"},
+                                     {3, "Failed to get Cell Array\n"}}));
+        EXPECT_EQ(parseCellMonitorArrayQuietly(LogRecord(record.bytes())), std::nullopt) << payload;
         EXPECT_EQ(log.lines(), (Lines{{3, "Cell Info Array data could not be constructed"}}));
     }
 }
 
 TEST(CellMonitor, ARecordShorterThanItsHeaderGivesNothing) {
     RecordingLog log;
-    EXPECT_EQ(readCellMonitorArray(LogRecord()), std::nullopt);
+    EXPECT_EQ(parseCellMonitorArrayQuietly(LogRecord()), std::nullopt);
     EXPECT_EQ(log.lines(), (Lines{{3, "Cell Info Array data could not be constructed"}}));
 }
 
+TEST(CellMonitor, WhatCannotBeReadEmptiesAListOfCellsAndLeavesKeys) {
+    RecordFixture<Numbers> numbers;
+    numbers.keys().set("First", "what was shown before");
+    numbers.feed(textRecord(kCellMonitor, "( a"));
+    expectInOrder(numbers.section(), Dictionary{{"First", "what was shown before"}});
+    RecordFixture<Entries> entries;
+    entries.list() = Array{"what was shown before"};
+    entries.feed(textRecord(kCellMonitor, "( a"));
+    EXPECT_TRUE(entries.list().empty());
+}
+
 TEST(CellMonitor, ARootThatIsNoArrayHasNoCells) {
-    RecordingLog log;
-    EXPECT_EQ(cellsOf(propertyListRecord(kCellMonitor, servingCell(310))), PropertyList(Array()));
-    EXPECT_EQ(cellsOf(propertyListRecord(kCellMonitor, "a text")), PropertyList(Array()));
-    EXPECT_EQ(log.lines(), Lines());
-}
-
-TEST(CellMonitor, TheSecondLineOfAFailureEndsInANewline) {
-    RecordingLog log;
-    logNoCellArray();
-    EXPECT_EQ(log.lines(), (Lines{{3, "Failed to get Cell Array\n"}}));
-}
-
-TEST(CellMonitor, ARecordThatLogsBothLinesDoesSoOnlyWithoutAnArray) {
-    RecordingLog log;
-    EXPECT_EQ(cellMonitorArrayOrLog(LogRecord()), std::nullopt);
-    EXPECT_EQ(log.take(), (Lines{{3, "Cell Info Array data could not be constructed"},
-                                 {3, "Failed to get Cell Array\n"}}));
-    const Record record = propertyListRecord(kCellMonitor, Array{"no cell"});
-    EXPECT_EQ(cellMonitorArrayOrLog(LogRecord(record.bytes())), Array{"no cell"});
-    EXPECT_EQ(log.lines(), Lines());
+    for (const PropertyList& root : {servingCell({}), PropertyList("a text")}) {
+        RecordFixture<Numbers> numbers;
+        numbers.feed(propertyListRecord(kCellMonitor, root));
+        EXPECT_EQ(numbers.lines, (Lines{{4, "Numbers"}}));
+        EXPECT_TRUE(numbers.keys().empty());
+        RecordFixture<Entries> entries;
+        entries.list() = Array{"what was shown before"};
+        entries.feed(propertyListRecord(kCellMonitor, root));
+        EXPECT_EQ(entries.lines, (Lines{{4, "Entries"}}));
+        EXPECT_TRUE(entries.list().empty());
+    }
 }
 
 // Cells
 
-TEST(CellMonitor, ACellIsOfItsTechnologyAndType) {
-    EXPECT_TRUE(isServingGSM(servingCell(1)));
-    EXPECT_FALSE(isCell(servingCell(1), kHXCellMonitorRadioAccessTechnologyUMTS,
-                        kHXCellMonitorCellTypeServing));
-    EXPECT_FALSE(isCell(servingCell(1), kHXCellMonitorRadioAccessTechnologyGSM,
-                        kHXCellMonitorCellTypeNeighbor));
+TEST(CellMonitor, ACellIsOfItsTechnologiesAndType) {
+    EXPECT_TRUE(kServingCell.looksFor(cell("GSM", "Serving")));
+    EXPECT_FALSE(kServingCell.looksFor(cell("UMTS", "Serving")));
+    EXPECT_FALSE(kServingCell.looksFor(cell("GSM", "Neighbor")));
+    EXPECT_TRUE(kNeighbours.looksFor(cell("GSM", "Neighbor")));
+    EXPECT_TRUE(kNeighbours.looksFor(cell("UMTS", "Neighbor")));
+    EXPECT_FALSE(kNeighbours.looksFor(cell("LTE", "Neighbor")));
 }
 
 TEST(CellMonitor, AnElementThatIsNoDictionaryIsNoCell) {
     for (const PropertyList& element :
          {PropertyList(), PropertyList("text"), PropertyList::integer(1), PropertyList(Array())}) {
-        EXPECT_FALSE(isServingGSM(element)) << element.description();
+        EXPECT_FALSE(kServingCell.looksFor(element)) << element.description();
     }
 }
 
 TEST(CellMonitor, AnElementThatLacksEitherKeyIsNoCell) {
     for (const std::string_view key :
          {kHXCellMonitorCellRadioAccessTechnology, kHXCellMonitorCellType}) {
-        const PropertyList cell = servingCell(1);
-        EXPECT_TRUE(cell.dictionary()->remove(key));
-        EXPECT_FALSE(isServingGSM(cell)) << key;
-        cell.dictionary()->setFixed(key, PropertyList::integer(1));
-        EXPECT_FALSE(isServingGSM(cell)) << key << " with a value that is no text";
+        const PropertyList element = servingCell({});
+        EXPECT_TRUE(element.dictionary()->remove(key));
+        EXPECT_FALSE(kServingCell.looksFor(element)) << key;
+        element.dictionary()->setFixed(key, PropertyList::integer(1));
+        EXPECT_FALSE(kServingCell.looksFor(element)) << key << " with a value that is no text";
     }
 }
 
-TEST(CellMonitor, TheFirstOfSeveralCellsIsFound) {
-    const Array cells = {"no cell", servingCell(1), servingCell(2)};
-    EXPECT_EQ(
-        findCell(cells, kHXCellMonitorRadioAccessTechnologyGSM, kHXCellMonitorCellTypeServing),
-        &cells[1]);
-    EXPECT_EQ(
-        findCell(cells, kHXCellMonitorRadioAccessTechnologyLTE, kHXCellMonitorCellTypeServing),
-        nullptr);
-    EXPECT_EQ(findCell({}, kHXCellMonitorRadioAccessTechnologyGSM, kHXCellMonitorCellTypeServing),
-              nullptr);
+/// What the record of numbers shows and logs of one cell.
+struct Shown {
+    PropertyList section;
+    Lines lines; ///< but for its first
+};
+
+Shown numbersOf(const Array& cells) {
+    RecordFixture<Numbers> fixture;
+    fixture.feed(cellsRecord(cells));
+    return {fixture.snapshot(), {fixture.lines.begin() + 1, fixture.lines.end()}};
+}
+
+TEST(CellMonitor, TheFirstOfSeveralCellsIsShown) {
+    const auto numbered = [](std::int64_t number) {
+        return servingCell({{"a", PropertyList::integer(number)},
+                            {"b", PropertyList::integer(number)},
+                            {"c", PropertyList::integer(number)}});
+    };
+    const auto [shown, lines] =
+        numbersOf({"no cell", cell("GSM", "Neighbor", {{"a", 3}}), numbered(1), numbered(2)});
+    expectInOrder(shown, Dictionary{{"Second", "1"}, {"First", "1"}, {"Third", "1"}});
+    EXPECT_EQ(lines, Lines());
+    const auto [none, nothing] = numbersOf({"no cell", cell("GSM", "Neighbor")});
+    expectInOrder(none, Dictionary());
+    EXPECT_EQ(nothing, Lines());
 }
 
 // Numbers
 
-constexpr std::string_view kFailure = "Failed to retrieve it\n";
-constexpr std::string_view kKey = "number";
-
-void expectNumber(const PropertyList& value, std::int32_t expected) {
-    RecordingLog log;
-    EXPECT_EQ(cellNumber(Dictionary{{"number", value}}, kKey, kFailure), expected);
-    EXPECT_EQ(log.lines(), Lines()) << value.description();
-}
-
-void expectNoNumber(const PropertyList& cell) {
-    RecordingLog log;
-    EXPECT_EQ(cellNumber(cell, kKey, kFailure), std::nullopt) << cell.description();
-    EXPECT_EQ(log.lines(), (Lines{{3, "Failed to retrieve it\n"}})) << cell.description();
+/// What is shown of a value under "a", or "(none)" with its line.
+std::string numberOf(const PropertyList& value) {
+    const auto [shown, lines] = numbersOf({servingCell({{"a", value}})});
+    const bool isMissed =
+        std::find(lines.begin(), lines.end(), RecordingLog::Line{3, "no a\n"}) != lines.end();
+    const PropertyList* first = shown.dictionary()->find("First");
+    EXPECT_EQ(first == nullptr, isMissed) << value.description();
+    return first != nullptr ? first->string().value_or("(no text)") : "(none)";
 }
 
 TEST(CellNumber, ReadsTheWhole32BitRange) {
-    expectNumber(PropertyList::integer(310), 310);
-    expectNumber(PropertyList::integer(2147483647), 2147483647);
-    expectNumber(PropertyList::integer(-2147483648LL), -2147483647 - 1);
+    EXPECT_EQ(numberOf(PropertyList::integer(310)), "310");
+    EXPECT_EQ(numberOf(PropertyList::integer(2147483647)), "2147483647");
+    EXPECT_EQ(numberOf(PropertyList::integer(-2147483648LL)), "-2147483648");
 }
 
 TEST(CellNumber, BeyondThe32BitRangeThereIsNone) {
-    expectNoNumber(Dictionary{{"number", PropertyList::integer(2147483648LL)}});
-    expectNoNumber(Dictionary{{"number", PropertyList::integer(-2147483649LL)}});
-    expectNoNumber(Dictionary{{"number", PropertyList::real(2147483648.0)}});
-    expectNoNumber(Dictionary{{"number", PropertyList::real(-2147483649.0)}});
+    EXPECT_EQ(numberOf(PropertyList::integer(2147483648LL)), "(none)");
+    EXPECT_EQ(numberOf(PropertyList::integer(-2147483649LL)), "(none)");
+    EXPECT_EQ(numberOf(PropertyList::real(2147483648.0)), "(none)");
+    EXPECT_EQ(numberOf(PropertyList::real(-2147483649.0)), "(none)");
 }
 
 TEST(CellNumber, OneBeyond64BitsWithASignLeavesTheRestOfTheListReadable) {
     const PropertyList large = PropertyList::unsignedInteger(9223372036854775808U);
-    const Array cells = {servingCell(310), Dictionary{{"number", large}}};
+    const Array cells = {servingCell({{"a", large}}), "no cell"};
     EXPECT_EQ(cellsOf(propertyListRecord(kCellMonitor, cells)), PropertyList(cells));
     const auto xml = serializeXml(PropertyList(cells));
     EXPECT_EQ(cellsOf(textRecord(kCellMonitor, *xml)), PropertyList(cells));
-    expectNoNumber(Dictionary{{"number", large}});
+    EXPECT_EQ(numberOf(large), "(none)");
 }
 
 TEST(CellNumber, ARealCountsWhenItIsWhole) {
-    expectNumber(PropertyList::real(-40.0), -40);
-    expectNumber(PropertyList::real(2147483647.0), 2147483647);
-    expectNoNumber(Dictionary{{"number", PropertyList::real(0.5)}});
+    EXPECT_EQ(numberOf(PropertyList::real(-40.0)), "-40");
+    EXPECT_EQ(numberOf(PropertyList::real(2147483647.0)), "2147483647");
+    EXPECT_EQ(numberOf(PropertyList::real(0.5)), "(none)");
 }
 
-TEST(CellNumber, AMissingKeyAndATextAreNoNumber) {
-    expectNoNumber(Dictionary{{"another", PropertyList::integer(1)}});
-    expectNoNumber(Dictionary{{"number", "310"}});
-    expectNoNumber(Dictionary{{"number", PropertyList::boolean(true)}});
-    expectNoNumber("no dictionary");
+TEST(CellNumber, ATextIsNoNumber) {
+    EXPECT_EQ(numberOf("310"), "(none)");
+    EXPECT_EQ(numberOf(PropertyList::boolean(true)), "(none)");
 }
-
-constexpr auto kNumbers = std::to_array<CellNumber>({
-    {"Second", "b", "no b\n"},
-    {"First", "a", "no a\n"},
-    {"Third", "c", "no c\n"},
-});
 
 TEST(CellNumber, SeveralAreShownInOrderAndAMissingOneStopsNoOther) {
+    const auto [shown, lines] = numbersOf(
+        {servingCell({{"c", PropertyList::integer(-3)}, {"b", PropertyList::real(2.0)}})});
+    expectInOrder(shown, Dictionary{{"Second", "2"}, {"Third", "-3"}});
+    EXPECT_EQ(lines, (Lines{{3, "no a\n"}}));
+    ASSERT_NE(shown.dictionary()->find("Third")->displayNumber(), nullptr);
+    EXPECT_EQ(shown.dictionary()->find("Third")->displayNumber()->integer(), -3);
+}
+
+TEST(CellNumber, WithoutASectionOnlyTheMissingOnesAreLogged) {
+    const Record record = cellsRecord({servingCell({{"a", PropertyList::integer(1)}})});
+    RecordingLog log;
+    Numbers().updateWithData(LogRecord(record.bytes()), kCellMonitor);
+    EXPECT_EQ(log.lines(), (Lines{{4, "Numbers"}, {3, "no b\n"}, {3, "no c\n"}}));
+}
+
+// Levels
+
+/// The entry of a neighbour with a level under each of the two keys.
+PropertyList levelsOf(std::int32_t number) {
+    RecordFixture<Entries> fixture;
+    fixture.feed(
+        cellsRecord({cell("GSM", "Neighbor", {{"ARFCN", 1}, {"RSSI", number}, {"RSCP", number}})}));
+    EXPECT_EQ(fixture.lines, (Lines{{4, "Entries"}}));
+    return fixture.list().front();
+}
+
+void expectLevels(std::int32_t number, const char* level, const char* doubled) {
+    expectInOrder(levelsOf(number),
+                  Dictionary{{"Channel", "1"}, {"Level", level}, {"Doubled", doubled}});
+}
+
+TEST(CellLevel, IsTheLow16BitsSignedTimesItsFactor) {
+    expectLevels(-40, "-40 dBm", "-80 dB");
+    expectLevels(0xFFD8, "-40 dBm", "-80 dB");
+    expectLevels(0x1FFD8, "-40 dBm", "-80 dB");
+    expectLevels(32766, "32766 dBm", "65532 dB");
+    expectLevels(32768, "-32768 dBm", "-65536 dB");
+    EXPECT_EQ(levelsOf(-40).dictionary()->find("Doubled")->displayNumber()->integer(), -80);
+}
+
+TEST(CellLevel, Is32767AsTheEmptyString) {
+    expectLevels(32767, "", "");
+    expectLevels(0x17FFF, "", ""); // by its low 16 bits
+}
+
+// Entries
+
+TEST(CellEntries, EveryCellOfTheKindHasTheFieldsThatItHolds) {
+    RecordFixture<Entries> fixture;
+    fixture.feed(cellsRecord({cell("LTE", "Neighbor", {{"RSSI", -1}}),
+                              cell("UMTS", "Neighbor", {{"RSSI", -40}, {"ARFCN", 62}}),
+                              cell("UMTS", "Serving", {{"RSSI", -2}, {"ARFCN", 63}}), "no cell",
+                              cell("GSM", "Neighbor")}));
+    ASSERT_EQ(fixture.list().size(), 2U);
+    expectInOrder(fixture.list()[0], Dictionary{{"Channel", "62"}, {"Level", "-40 dBm"}});
+    expectInOrder(fixture.list()[1], Dictionary());
+    EXPECT_EQ(fixture.lines, (Lines{{4, "Entries"}, {3, "no channel\n"}, {3, "no level\n"}}));
+}
+
+// Without a layout
+
+TEST(CellsWithoutALayout, AreTheElementsOfTheArray) {
+    RecordingLog log;
+    const auto readFrom = [](const PropertyList& root) {
+        const Record record = propertyListRecord(kCellMonitor, root);
+        return readCellMonitorArray(LogRecord(record.bytes()));
+    };
+    EXPECT_EQ(readFrom(Array{"no cell"}), Array{"no cell"});
+    EXPECT_EQ(readFrom("a text"), Array());
+    EXPECT_EQ(log.take(), Lines());
+    EXPECT_EQ(readCellMonitorArray(LogRecord()), std::nullopt);
+    EXPECT_EQ(log.lines(), (Lines{{3, "Cell Info Array data could not be constructed"}}));
+}
+
+TEST(CellsWithoutALayout, AreOfATechnologyAndAType) {
+    const auto isServingGsm = [](const PropertyList& element) {
+        return isCell(element, kHXCellMonitorRadioAccessTechnologyGSM,
+                      kHXCellMonitorCellTypeServing);
+    };
+    EXPECT_TRUE(isServingGsm(cell("GSM", "Serving")));
+    EXPECT_FALSE(isServingGsm(cell("UMTS", "Serving")));
+    EXPECT_FALSE(isServingGsm(cell("GSM", "Neighbor")));
+    EXPECT_FALSE(isServingGsm("no cell"));
+}
+
+TEST(CellsWithoutALayout, ShowTheirNumbersAndLogTheMissing) {
+    constexpr auto kNumbers = std::to_array<CellNumber>(
+        {{"Second", "b", "no b\n"}, {"First", "a", "no a\n"}, {"Third", "c", "no c\n"}});
     RecordingLog log;
     const auto shown = std::make_shared<Dictionary>();
     showCellNumbers(shown, kNumbers,
                     Dictionary{{"c", PropertyList::integer(-3)}, {"b", PropertyList::real(2.0)}});
     expectInOrder(shown, Dictionary{{"Second", "2"}, {"Third", "-3"}});
-    EXPECT_EQ(log.lines(), (Lines{{3, "no a\n"}}));
-    ASSERT_NE(shown->find("Third")->displayNumber(), nullptr);
-    EXPECT_EQ(shown->find("Third")->displayNumber()->integer(), -3);
-}
-
-TEST(CellNumber, WithoutATargetOnlyTheMissingOnesAreLogged) {
-    RecordingLog log;
+    EXPECT_EQ(log.take(), (Lines{{3, "no a\n"}}));
     showCellNumbers(nullptr, kNumbers, Dictionary{{"a", PropertyList::integer(1)}});
     EXPECT_EQ(log.lines(), (Lines{{3, "no b\n"}, {3, "no c\n"}}));
-}
-
-// Levels
-
-std::string level(std::int32_t number, int factor = 1) {
-    return cellLevel(number, kDecimalDbm, factor).string().value_or("(no text)");
-}
-
-TEST(CellLevel, IsTheLow16BitsSigned) {
-    EXPECT_EQ(level(-40), "-40 dBm");
-    EXPECT_EQ(level(0xFFD8), "-40 dBm");
-    EXPECT_EQ(level(0x1FFD8), "-40 dBm");
-    EXPECT_EQ(level(32766), "32766 dBm");
-    EXPECT_EQ(level(32768), "-32768 dBm");
-}
-
-TEST(CellLevel, TimesItsFactor) {
-    EXPECT_EQ(level(-40, 2), "-80 dBm");
-    EXPECT_EQ(level(-32768, 2), "-65536 dBm");
-    EXPECT_EQ(cellLevel(-40, kDecimalDbm, 2).displayNumber()->integer(), -80);
-}
-
-TEST(CellLevel, Is32767AsTheEmptyString) {
-    EXPECT_EQ(level(32767), "");
-    EXPECT_EQ(level(32767, 2), "");
-    EXPECT_EQ(level(0x17FFF), "") << "by its low 16 bits";
-}
-
-constexpr auto kLevels = std::to_array<CellLevel>({
-    {"Level", "l", "no l\n", &kDecimalDbm, 2},
-    {"Ratio", "r", "no r\n", &kDecimalDb},
-});
-
-TEST(CellLevel, SeveralAreShownInOrderAndAMissingOneStopsNoOther) {
-    RecordingLog log;
-    const auto shown = std::make_shared<Dictionary>();
-    showCellLevels(shown, kLevels,
-                   Dictionary{{"r", PropertyList::integer(-7)}, {"l", PropertyList::integer(-40)}});
-    expectInOrder(shown, Dictionary{{"Level", "-80 dBm"}, {"Ratio", "-7 dB"}});
-    EXPECT_EQ(log.take(), Lines());
-    const auto partly = std::make_shared<Dictionary>();
-    showCellLevels(partly, kLevels, Dictionary{{"r", PropertyList::integer(32767)}});
-    expectInOrder(partly, Dictionary{{"Ratio", ""}});
-    EXPECT_EQ(log.lines(), (Lines{{3, "no l\n"}}));
-}
-
-TEST(CellLevel, WithoutATargetOnlyTheMissingOnesAreLogged) {
-    RecordingLog log;
-    showCellLevels(nullptr, kLevels, Dictionary{{"l", PropertyList::integer(1)}});
-    EXPECT_EQ(log.lines(), (Lines{{3, "no r\n"}}));
-}
-
-// Entries
-
-TEST(CellEntries, EveryCellOfTheKindHasItsNumbersAndBehindThemItsLevels) {
-    RecordingLog log;
-    const Array cells = {cell("GSM", "Neighbor", {{"RSSI", -1}}),
-                         cell("UMTS", "Neighbor", {{"RSSI", -40}, {"ARFCN", 62}}),
-                         cell("UMTS", "Serving", {{"RSSI", -2}, {"ARFCN", 63}}), "no cell",
-                         cell("UMTS", "Neighbor")};
-    constexpr auto kNumber =
-        std::to_array<CellNumber>({{"Channel", kHXCellMonitorARFCN, "no channel\n"}});
-    constexpr auto kLevel =
-        std::to_array<CellLevel>({{"Level", kHXCellMonitorRSSI, "no level\n", &kDecimalDbm}});
-    const Array entries = cellEntries(cells, kHXCellMonitorRadioAccessTechnologyUMTS,
-                                      kHXCellMonitorCellTypeNeighbor, kNumber, kLevel);
-    ASSERT_EQ(entries.size(), 2U);
-    expectInOrder(entries[0], Dictionary{{"Channel", "62"}, {"Level", "-40 dBm"}});
-    expectInOrder(entries[1], Dictionary());
-    EXPECT_EQ(log.lines(), (Lines{{3, "no channel\n"}, {3, "no level\n"}}));
 }
 
 } // namespace
