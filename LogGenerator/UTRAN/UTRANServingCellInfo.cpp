@@ -72,64 +72,6 @@ constexpr RecordLayout kLayout{
 
 } // namespace
 
-<<<<<<< HEAD
 UTRANServingCellInfo::UTRANServingCellInfo() : LayoutRecord(kLayout) {}
-=======
-std::span<const LogCode> UTRANServingCellInfo::getLogCodeArray() const {
-    return kLogCodes;
-}
-
-void UTRANServingCellInfo::updateWithData(const LogRecord& record, LogCode logCode) {
-    systemLog(LogPriority::Warning, "Serving Cell Info");
-    if (logCode == kCellMonitorLogCode) {
-        updateFromCellMonitor(record);
-    } else if (logCode == kServingCellLogCode && record.has(kServingCellLength)) {
-        show(kFields, record);
-    }
-}
-
-bool UTRANServingCellInfo::replacesShown(const LogRecord& record, LogCode logCode) const {
-    return logCode == kServingCellLogCode && record.has(kServingCellLength);
-}
-
-void UTRANServingCellInfo::updateFromCellMonitor(const LogRecord& record) {
-    const auto cells = readCellMonitorArray(record);
-    if (!cells) {
-        return;
-    }
-    for (const PropertyList& cell : *cells) {
-        if (isCell(cell, kHXCellMonitorRadioAccessTechnologyUTRAN2,
-                   kHXCellMonitorCellTypeServing)) {
-            showServingCell(cell);
-        }
-    }
-}
-
-void UTRANServingCellInfo::showServingCell(const PropertyList& cell) {
-    showCellNumbers(sectionRef().dictionary(), kCellNumbers, cell);
-    const auto uarfcn =
-        cellNumber(cell, kHXCellMonitorUARFCN, "Serving Cell Info: Failed to retrieve UARFCN\n");
-    if (uarfcn) { // the service knows one frequency, not which link it belongs to
-        show(kUplinkKey, DisplayNumber(std::int64_t{*uarfcn}, kDecimal));
-        show(kDownlinkKey, DisplayNumber(std::int64_t{*uarfcn}, kDecimal));
-    }
-}
-
-RecordDescription UTRANServingCellInfo::describe() const {
-    CodeDescription cell{kServingCellLogCode, kServingCellLength};
-    cell.fields = describeFields(kFields);
-    CodeDescription monitored = describeCells(ListPartDescription{ListPartDescription::Kind::EachCell,
-                                                       {kHXCellMonitorRadioAccessTechnologyUTRAN2},
-                                                       kHXCellMonitorCellTypeServing},
-                                              kCellNumbers);
-    for (const std::string_view key : {kUplinkKey, kDownlinkKey}) {
-        FieldDescription field{std::string(key)};
-        field.shownAs.format = &kDecimal;
-        field.listKey = kHXCellMonitorUARFCN;
-        monitored.fields.push_back(std::move(field));
-    }
-    return {std::move(cell), std::move(monitored)};
-}
->>>>>>> ed363bb (Common: the cell monitor's helpers that have no caller are gone)
 
 } // namespace pallax
