@@ -5,6 +5,7 @@
 #include "LogGenerator/C2K/EVDOStatus.h"
 #include "LogGenerator/C2K/FingerC2I.h"
 #include "LogGenerator/C2K/ForwardDataRate.h"
+#include "LogGenerator/C2K/LookupDisplay.h"
 #include "LogGenerator/C2K/OneXStatus.h"
 #include "LogGenerator/C2K/OneXSystemIdentity.h"
 #include "LogGenerator/C2K/OneXTrafficErrors.h"
@@ -44,7 +45,7 @@ DictionaryRef dictionaryUnder(std::string_view key, const Dictionary& state) {
 } // namespace
 
 C2KLogGenerator::C2KLogGenerator(const GeneratorEnvironment& environment)
-    : ZORLogGenerator(environment), _display(kCodes) {}
+    : ZORLogGenerator(environment), _display(std::make_unique<LookupDisplay>(kCodes)) {}
 
 C2KLogGenerator::~C2KLogGenerator() {
     C2KLogGenerator::catchUp(); // the display outlives its generator
@@ -130,13 +131,13 @@ void C2KLogGenerator::updateFromLog(Bytes packet, const DictionaryRef& lookup, D
         return;
     }
     if ((*code)->accepts(**code, record)) {
-        _display.take(static_cast<std::size_t>(code - kCodes.begin()), record, lookup, state);
+        _display->take(static_cast<std::size_t>(code - kCodes.begin()), record, lookup, state);
     }
     capture(record.bytes());
 }
 
 void C2KLogGenerator::catchUp() {
-    _display.bringUpToDate();
+    _display->bringUpToDate();
 }
 
 PropertyList C2KLogGenerator::generateLogUsingState(Dictionary& state) {

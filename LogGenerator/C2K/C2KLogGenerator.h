@@ -1,6 +1,5 @@
 #pragma once
 
-#include "LogGenerator/C2K/LookupDisplay.h"
 #include "LogGenerator/ZORLogGenerator.h"
 
 #include <memory>
@@ -9,6 +8,7 @@
 namespace pallax {
 
 struct CodeDescription;
+class LookupDisplay;
 
 /// The generator of the CDMA technology, 1x and EV-DO. It has no records with sections of their
 /// own: the layout of a log code tells which value stands under which lookup name, and the
@@ -48,7 +48,7 @@ public:
     static std::vector<CodeDescription> describe();
 
 private:
-    LookupDisplay _display;
+    std::unique_ptr<LookupDisplay> _display;
 };
 
 } // namespace pallax

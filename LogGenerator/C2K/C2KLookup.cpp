@@ -28,11 +28,11 @@ void addLookupPlace(const Text& lookupName, const Text& key, const DictionaryRef
     places->emplace_back(std::move(place));
 }
 
-void setLookupValue(std::string_view lookupName, const PropertyList& value,
-                    const Dictionary& lookup) {
+std::vector<LookupPlace> lookupPlaces(std::string_view lookupName, const Dictionary& lookup) {
+    std::vector<LookupPlace> found;
     const ArrayRef places = placesOf(lookupName, lookup);
     if (places == nullptr) {
-        return;
+        return found;
     }
     for (const PropertyList& each : *places) {
         const DictionaryRef place = each.dictionary();
@@ -41,9 +41,17 @@ void setLookupValue(std::string_view lookupName, const PropertyList& value,
         const DictionaryRef display = dict != nullptr ? dict->dictionary() : nullptr;
         const Text* name = key != nullptr ? key->text() : nullptr;
         if (display == nullptr || name == nullptr) {
-            return;
+            break;
         }
-        display->set(*name, value);
+        found.push_back({*name, display});
+    }
+    return found;
+}
+
+void setLookupValue(std::string_view lookupName, const PropertyList& value,
+                    const Dictionary& lookup) {
+    for (const LookupPlace& place : lookupPlaces(lookupName, lookup)) {
+        place.display->set(place.key, value);
     }
 }
 

@@ -14,16 +14,19 @@ constexpr std::string_view kSortedMark = "_sorted";
 } // namespace
 
 LookupDisplay::LookupDisplay(std::span<const CodeLayout* const> codes) {
+    FieldId row = 0;
     for (const CodeLayout* code : codes) {
-        _codes.push_back({code, isReadLate(*code)});
+        _codes.push_back({code, row, isReadLate(*code)});
+        row += static_cast<FieldId>(rowCount(*code));
     }
+    _places.resize(row);
 }
 
 void LookupDisplay::take(std::size_t index, const LogRecord& packet, const DictionaryRef& lookup,
                          Dictionary& state) {
     Code& code = _codes[index];
     if (!code.isReadLate) {
-        return read(*code.layout, packet, lookup.get(), &state);
+        return read(code, packet, lookup, &state);
     }
     code.packet.assign(packet.bytes().begin(), packet.bytes().end());
     code.lookup = lookup;
@@ -32,25 +35,51 @@ void LookupDisplay::take(std::size_t index, const LogRecord& packet, const Dicti
 void LookupDisplay::bringUpToDate() {
     for (Code& code : _codes) {
         if (const DictionaryRef lookup = std::exchange(code.lookup, nullptr)) {
-            read(*code.layout, LogRecord(code.packet), lookup.get(), nullptr);
+            read(code, LogRecord(code.packet), lookup, nullptr);
         }
     }
 }
 
-void LookupDisplay::read(const CodeLayout& code, const LogRecord& packet, const Dictionary* lookup,
+void LookupDisplay::read(const Code& code, const LogRecord& packet, const DictionaryRef& lookup,
                          Dictionary* state) {
-    _lookup = lookup;
+    if (lookup != _lookup) {
+        findPlaces(lookup);
+    }
     _memory.state = state;
-    LayoutReader(*this, _memory, 0).read(code, packet);
+    LayoutReader(*this, _memory, code.firstRow).read(*code.layout, packet);
+}
+
+void LookupDisplay::findPlaces(const DictionaryRef& lookup) {
+    _lookup = lookup;
+    const auto placesOf = [&lookup](std::string_view name) {
+        return lookup != nullptr ? lookupPlaces(name, *lookup) : std::vector<LookupPlace>();
+    };
+    for (const Code& code : _codes) {
+        FieldId row = code.firstRow;
+        const auto findAll = [&](std::span<const Field> fields, std::span<const ListLayout> lists) {
+            for (const Field& field : fields) {
+                _places[row++] = placesOf(field.key);
+            }
+            row += static_cast<FieldId>(rowCount(lists));
+        };
+        findAll(code.layout->fields, code.layout->lists);
+        for (const SubpacketLayout& subpacket : code.layout->subpackets) {
+            findAll(subpacket.fields, subpacket.lists);
+        }
+    }
 }
 
 void LookupDisplay::sample(const Sample& sample) {
-    PropertyList value;
-    sample.value.showIn(value);
     if (_pilots != nullptr) {
-        _pilots->set(_pilot, std::move(value));
-    } else if (_lookup != nullptr) {
-        setLookupValue(sample.field.key, value, *_lookup);
+        PropertyList value;
+        sample.value.showIn(value);
+        _pilots->set(std::exchange(_pilot, {}), std::move(value));
+        return;
+    }
+    for (const LookupPlace& place : _places[sample.id]) {
+        PropertyList value;
+        sample.value.showIn(value);
+        place.display->set(place.key, std::move(value));
     }
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/C2K/C2KLookup.h"
 #include "LogGenerator/Records/Sample.h"
 #include "plist/PropertyList.h"
 
@@ -40,19 +41,24 @@ public:
 private:
     struct Code {
         const CodeLayout* layout;
+        FieldId firstRow;
         bool isReadLate;
         // The latest packet that waits, and the table for it; null: none.
         DictionaryRef lookup = nullptr;
         ByteBuffer packet = {};
     };
 
-    void read(const CodeLayout& code, const LogRecord& packet, const Dictionary* lookup,
+    void read(const Code& code, const LogRecord& packet, const DictionaryRef& lookup,
               Dictionary* state);
+    void findPlaces(const DictionaryRef& lookup);
 
     std::vector<Code> _codes;
     RecordMemory _memory;
-    const Dictionary* _lookup = nullptr; ///< while a packet is read; null without one
-    DictionaryRef _pilots;               ///< of the list that has begun and not ended
+    /// The table that the places are of. Looking each value up in it took a quarter of the time of
+    /// decoding a CDMA drive.
+    DictionaryRef _lookup;
+    std::vector<std::vector<LookupPlace>> _places; ///< by row
+    DictionaryRef _pilots;                         ///< of the list that has begun and not ended
     const ListLayout* _list = nullptr;
     std::string _pilot; ///< the key of its entry
 };

@@ -13,6 +13,10 @@ bool holds(const Dictionary& cell, std::string_view key, std::string_view value)
     return found != nullptr && found->string() == value;
 }
 
+bool mayBeLeftOut(const Field& field) {
+    return field.condition != nullptr && field.condition->otherwise.empty();
+}
+
 bool isRunning(std::span<const Field> fields) {
     return std::any_of(fields.begin(), fields.end(), [](const Field& field) {
         return field.computation != nullptr && field.computation->isRunning;
@@ -63,12 +67,6 @@ std::size_t rowCount(const CodeLayout& code) {
     return rows;
 }
 
-bool isAllowed(const CodeLayout& code, const LogRecord& record) {
-    return record.has(code.minimumLength) &&
-           (!code.exactLength || record.length() == code.minimumLength) &&
-           (code.condition == nullptr || code.condition->holdsIn(record));
-}
-
 bool isReadLate(const CodeLayout& code) {
     return code.listPart == nullptr && code.logsSection == nullptr && !isRunning(code.fields) &&
            std::none_of(code.subpackets.begin(), code.subpackets.end(),
@@ -77,10 +75,16 @@ bool isReadLate(const CodeLayout& code) {
                         [](const ListLayout& list) { return !list.rememberedAs.empty(); });
 }
 
+bool hasShapes(const CodeLayout& code) {
+    return std::any_of(code.fields.begin(), code.fields.end(), mayBeLeftOut) ||
+           std::any_of(code.lists.begin(), code.lists.end(),
+                       [](const ListLayout& list) { return list.staysWithoutEntries; });
+}
+
 unsigned shapeOf(const CodeLayout& code, const LogRecord& record) {
     unsigned shape = 0;
     for (const Field& field : code.fields) {
-        if (field.condition != nullptr && field.condition->otherwise.empty()) {
+        if (mayBeLeftOut(field)) {
             shape = shape * 2 + (field.condition->holdsIn(record) ? 1 : 0);
         }
     }

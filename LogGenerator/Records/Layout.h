@@ -293,11 +293,17 @@ std::size_t rowCount(const SubpacketLayout& subpacket);
 std::size_t rowCount(const CodeLayout& code);
 
 /// Whether `minimumLength`, `exactLength` and `condition` allow the record.
-bool isAllowed(const CodeLayout& code, const LogRecord& record);
+inline bool isAllowed(const CodeLayout& code, const LogRecord& record) {
+    return record.has(code.minimumLength) &&
+           (!code.exactLength || record.length() == code.minimumLength) &&
+           (code.condition == nullptr || code.condition->holdsIn(record));
+}
 
 /// Whether records under the code may be read as late as somebody looks: reading one changes
 /// nothing but the section, and cannot fail.
 bool isReadLate(const CodeLayout& code);
+/// Whether its records may set different keys.
+bool hasShapes(const CodeLayout& code);
 /// A number that is the same for records that set the same keys, so that the later one leaves
 /// nothing of the earlier.
 unsigned shapeOf(const CodeLayout& code, const LogRecord& record);

@@ -58,11 +58,14 @@ private:
     }
 
     void readSubpacket(const SubpacketLayout& subpacket) {
-        const FieldId behind = _next + static_cast<FieldId>(rowCount(subpacket));
+        if (subpacket.fields.empty() && subpacket.lists.empty()) {
+            return;
+        }
         if (const auto place = findSubpacket(_place.record, subpacket.id)) {
             readIn(*place, subpacket.fields, subpacket.lists);
+        } else {
+            _next += static_cast<FieldId>(rowCount(subpacket));
         }
-        _next = behind;
     }
 
     void readFields(const LogRecord& place, std::span<const Field> fields) {

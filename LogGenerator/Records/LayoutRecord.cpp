@@ -70,7 +70,7 @@ void logUnexpectedSizes(const CodeLayout& code, const LogRecord& record) {
 LayoutRecord::LayoutRecord(const RecordLayout& layout) : _layout(layout), _display(_memory) {
     FieldId row = 0;
     for (const CodeLayout& code : layout.codes) {
-        _codes.push_back({&code, row, pallax::isReadLate(code), checksSize(code)});
+        _codes.push_back({&code, row, pallax::isReadLate(code), checksSize(code), hasShapes(code)});
         _logCodes.push_back(code.logCode);
         row += static_cast<FieldId>(rowCount(code));
     }
@@ -128,7 +128,7 @@ void LayoutRecord::receive(const LogRecord& record, LogCode logCode) {
     if (_sink != nullptr) {
         LayoutReader(*_sink, _memory, _firstRow + code->firstRow).read(layout, record);
     }
-    _display.keep(layout, record);
+    _display.keep(layout, record, code->hasShapes ? shapeOf(layout, record) : 0);
 }
 
 void LayoutRecord::readNow(const Code& code, const LogRecord& record) {

@@ -43,6 +43,7 @@ private:
         FieldId firstRow; ///< from the record's first
         bool isReadLate;
         bool checksSize;
+        bool hasShapes;
     };
 
     const Code* codeOf(LogCode logCode) const;

@@ -12,8 +12,7 @@ void SectionDisplay::setSection(const PropertyList& section) {
     _list = section.array();
 }
 
-void SectionDisplay::keep(const CodeLayout& code, const LogRecord& record) {
-    const unsigned shape = shapeOf(code, record);
+void SectionDisplay::keep(const CodeLayout& code, const LogRecord& record, unsigned shape) {
     if (_keptCode != &code || _keptShape != shape) {
         bringUpToDate();
     }

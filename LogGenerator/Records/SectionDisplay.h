@@ -24,8 +24,9 @@ public:
 
     void setSection(const PropertyList& section);
 
-    /// Keeps an accepted record that may be read late, in place of the one before.
-    void keep(const CodeLayout& code, const LogRecord& record);
+    /// Keeps an accepted record that may be read late, in place of the one before. `shape` is its
+    /// `shapeOf`, or 0 where the code has no shapes.
+    void keep(const CodeLayout& code, const LogRecord& record, unsigned shape);
     /// Reads the record that is kept.
     void bringUpToDate();
 

@@ -91,6 +91,16 @@ TEST_F(LookupDisplayTest, WithoutALookupTableRunningValuesAreKeptAllTheSame) {
     EXPECT_EQ(*state.find("Packets"), PropertyList::integer(1));
 }
 
+TEST_F(LookupDisplayTest, AnotherLookupTableHasOtherPlaces) {
+    take(1, Record(2));
+    const auto another = std::make_shared<Dictionary>();
+    lookup = std::make_shared<Dictionary>();
+    addLookupPlace("kCount", "Count", another, *lookup);
+    take(1, Record(2));
+    EXPECT_EQ(value("kCount"), PropertyList("1"));
+    EXPECT_EQ(PropertyList(another), PropertyList(Dictionary{{"Count", "2"}}));
+}
+
 TEST_F(LookupDisplayTest, AListByPilotIsSharedBetweenItsPlaces) {
     const auto section = std::make_shared<Dictionary>();
     addLookupPlace("kPilots", "Once more", section, *lookup);
