@@ -65,9 +65,9 @@ public:
     /// The live display, with every packet that has arrived; null while there is none.
     PropertyList display() { return _driver.display(); }
 
-    /// From the next display tick with new data on the observer gets the tick's frame, once the
-    /// model's observer has been told, for as long as the observer lives. Frames are made only
-    /// while somebody observes; their tree is that of `topLevelNodes`.
+    /// As long as the observer lives, it gets the frame of each display tick with new data, after
+    /// the model's observer has been told. The model makes frames only while they are observed, of
+    /// the tree that `topLevelNodes` gives.
     void observeFrames(std::weak_ptr<FrameObserver> observer) {
         _frameObservers.push_back(std::move(observer));
     }

@@ -12,7 +12,7 @@
 #include <thread>
 
 // Frames are read by a second thread while packets change the display that they were made of. Built
-// with -fsanitize=thread, these tests find whatever a frame shares with the live display.
+// with -fsanitize=thread, these tests find what a frame shares with the live display.
 
 namespace pallax {
 namespace {
