@@ -5,7 +5,7 @@
 
 namespace pallax {
 
-/// Where `wanted` first stands in `text`, whatever the case of ASCII letters; npos where it does
+/// Where `wanted` first stands in `text`, ignoring the case of ASCII letters; npos where it does
 /// not.
 std::size_t findIgnoringCase(std::string_view text, std::string_view wanted);
 

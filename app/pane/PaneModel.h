@@ -43,15 +43,15 @@ public:
     /// A row in words and numbers; an empty one where there is no such row.
     PaneRow row(std::size_t row) const;
 
-    /// Rows whose name or value holds this text stay, whatever the case of ASCII letters; the
-    /// empty text lets all stay.
+    /// Rows whose name or value holds this text stay, ignoring the case of ASCII letters; the empty
+    /// text lets all stay.
     void setFilter(std::string text);
     const std::string& filter() const { return _filter; }
     void setOrder(PaneOrder order);
     const PaneOrder& order() const { return _order; }
 
     std::size_t shownRows() const;
-    /// The row behind a shown one; `shown` is below shownRows().
+    /// Which row a shown one is; `shown` is below shownRows().
     std::size_t rowAt(std::size_t shown) const;
 
     /// The shown row on which the cursor stands; below shownRows() unless there are none.

@@ -22,9 +22,9 @@ struct PaneRow {
     bool isBranch = false;
     /// A leaf whose value is another than in the data that the pane showed before.
     bool hasChanged = false;
-    /// The time of the data that brought a leaf's present value; its age counts from here. Nothing
-    /// where the pane cannot know: the value was there in its first data, the data came without a
-    /// time, or the pane was not asked for this row in all its data since.
+    /// The time of the data that brought a leaf's present value; the value's age counts from here.
+    /// Nothing where the pane does not know it: the value was in the pane's first data, the data
+    /// had no time, or the row was not asked for every time that new data had come.
     std::optional<Time> changedAt;
     /// As PallaxModelNode::readAt.
     std::optional<Time> readAt;

@@ -20,7 +20,10 @@ std::shared_ptr<ui::TableCell> TerminalTable::dequeueReusableCell(std::string_vi
 }
 
 PaneModel& TerminalTable::pane() const {
-    return dynamic_cast<PaneOwner&>(_source).pane();
+    if (_pane == nullptr) {
+        _pane = &dynamic_cast<PaneOwner&>(_source).pane();
+    }
+    return *_pane;
 }
 
 std::optional<std::string> TerminalTable::cursorName() const {

@@ -61,6 +61,7 @@ private:
     void keepCursorInWindow();
 
     ui::TableSource& _source;
+    mutable PaneModel* _pane = nullptr; ///< the source's, once it was asked for
     ui::Rect _contentBounds;
     NeedsDisplay _needsDisplay;
     std::size_t _windowRows = 1;
