@@ -6,6 +6,7 @@
 #include "decoding/DecodeProgress.h"
 #include "decoding/DroppedNotices.h"
 #include "decoding/OrderedWorkers.h"
+#include "decoding/Preconditions.h"
 #include "decoding/RequiredTemplates.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
@@ -18,7 +19,6 @@
 #include <cstdio>
 #include <optional>
 #include <string>
-#include <sys/stat.h>
 #include <thread>
 #include <unistd.h>
 
@@ -26,41 +26,16 @@ namespace pallax {
 
 namespace {
 
-/// Nothing for what cannot be looked at; its reader has the sentence. "-" is standard input.
-std::optional<struct stat> fileStatus(const std::string& recording) {
-    struct stat status {};
-    const int result =
-        recording == "-" ? ::fstat(STDIN_FILENO, &status) : ::stat(recording.c_str(), &status);
-    return result == 0 ? std::optional(status) : std::nullopt;
-}
-
-/// The recording that is the same file, as the user named it.
-std::optional<std::string> recordingIn(const struct stat& file, const DecodeOptions& options) {
-    for (const std::string& recording : options.recordings) {
-        const auto status = fileStatus(recording);
-        if (status && S_ISREG(file.st_mode) && status->st_dev == file.st_dev &&
-            status->st_ino == file.st_ino) {
-            return recording == "-" ? "of standard input" : recording;
-        }
-    }
-    return std::nullopt;
-}
-
 /// Why one of the recordings would be written over; nothing when none would.
 std::optional<std::string> lossOfInput(const DecodeOptions& options) {
-    struct stat file {};
-    if (::fstat(STDOUT_FILENO, &file) == 0) {
-        if (const auto recording = recordingIn(file, options)) {
-            return formatText("Standard output would go into the recording %@.", {*recording});
-        }
+    if (auto loss = outputIntoRecording(options.recordings)) {
+        return loss;
     }
-    if (options.systemLog && ::stat(options.systemLog->c_str(), &file) == 0) {
-        if (const auto recording = recordingIn(file, options)) {
-            return formatText("The system log %@ would replace the recording %@.",
-                              {*options.systemLog, *recording});
-        }
-    }
-    return std::nullopt;
+    const auto log = options.systemLog ? regularFile(*options.systemLog) : std::nullopt;
+    const auto recording = recordingAmong(options.recordings, log);
+    return recording ? std::optional(formatText("The system log %@ would replace the recording %@.",
+                                                {*options.systemLog, *recording}))
+                     : std::nullopt;
 }
 
 /// Gives the command, wired to this machine, to `use`.

@@ -3,6 +3,7 @@
 #include "text/Format.h"
 
 #include <algorithm>
+#include <unistd.h>
 
 namespace pallax {
 
@@ -21,6 +22,24 @@ std::optional<std::string> missingGenerator(const Recording& recording,
         return std::nullopt;
     }
     return noGeneratorSentence(recording.name(), recorded->identifier);
+}
+
+std::optional<std::string> recordingAmong(std::span<const std::string> recordings,
+                                          const std::optional<FileIdentity>& file) {
+    for (const std::string& recording : recordings) {
+        const bool isInput = recording == "-";
+        if (file && file == (isInput ? regularFile(STDIN_FILENO) : regularFile(recording))) {
+            return isInput ? "of standard input" : recording;
+        }
+    }
+    return std::nullopt;
+}
+
+std::optional<std::string> outputIntoRecording(std::span<const std::string> recordings) {
+    const auto recording = recordingAmong(recordings, regularFile(STDOUT_FILENO));
+    return recording ? std::optional(formatText("Standard output would go into the recording %@.",
+                                                {*recording}))
+                     : std::nullopt;
 }
 
 } // namespace pallax

@@ -127,8 +127,7 @@ Result<std::unique_ptr<PcapNgWriter>, HostError> PcapNgWriter::create(const std:
 std::optional<HostError> PcapNgWriter::open(bool isNew) {
     struct stat status {};
     _isFile = _file && ::fstat(_number, &status) == 0 && S_ISREG(status.st_mode);
-    _device = status.st_dev;
-    _inode = status.st_ino;
+    _identity = identityOf(status);
     if (_isFile && ::flock(_number, LOCK_EX | LOCK_NB) != 0 && errno == EWOULDBLOCK) {
         return HostError{formatText("%@ is being read or written by another program.", {_name})};
     }
@@ -190,8 +189,7 @@ std::optional<HostError> PcapNgWriter::write(Time time, Bytes packet) {
 /// The size of the file to which the path leads, if that is the one that is written.
 std::optional<std::uint64_t> PcapNgWriter::sizeInPlace() const {
     struct stat there {};
-    const bool isThere =
-        ::stat(_name.c_str(), &there) == 0 && there.st_dev == _device && there.st_ino == _inode;
+    const bool isThere = ::stat(_name.c_str(), &there) == 0 && identityOf(there) == _identity;
     return isThere ? std::optional(static_cast<std::uint64_t>(there.st_size)) : std::nullopt;
 }
 

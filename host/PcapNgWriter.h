@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/Descriptor.h"
+#include "host/FileIdentity.h"
 #include "host/HostError.h"
 #include "text/Bytes.h"
 #include "text/Date.h"
@@ -67,8 +68,7 @@ private:
     Descriptor _file;     // empty for standard output
     int _number;          // the descriptor for writing
     bool _isFile = false; // it is a regular file
-    dev_t _device = 0;    // its device
-    ino_t _inode = 0;
+    FileIdentity _identity;
     bool _isNew = false;   // this writer created it
     bool _isBegun = false; // its old content is gone
     std::uint64_t _size = 0;

@@ -1,6 +1,7 @@
 #include "host/SocketLocalPort.h"
 
 #include "host/AsioMainQueue.h"
+#include "host/FileIdentity.h"
 #include "host/PortFrame.h"
 #include "host/SourceTimeListener.h"
 #include "host/UnixSocket.h"
@@ -24,20 +25,14 @@ constexpr std::chrono::milliseconds kAcceptRetryDelay{100};
 
 /// What outlives the port while one of its blocks runs.
 struct SocketLocalPort::State : std::enable_shared_from_this<State> {
-    /// Which file a path leads to, so that only our own is removed.
-    struct FileIdentity {
-        dev_t device = 0;
-        ino_t inode = 0;
-        friend bool operator==(const FileIdentity&, const FileIdentity&) = default;
-    };
-    static FileIdentity identityOf(const std::string& path) {
+    /// Which file the path itself is, so that only our own is removed.
+    static FileIdentity fileAt(const std::string& path) {
         struct stat status {};
-        return ::lstat(path.c_str(), &status) == 0 ? FileIdentity{status.st_dev, status.st_ino}
-                                                   : FileIdentity{};
+        return ::lstat(path.c_str(), &status) == 0 ? identityOf(status) : FileIdentity{};
     }
 
     explicit State(Setup from)
-        : setup(std::move(from)), identity(identityOf(setup.path)),
+        : setup(std::move(from)), identity(fileAt(setup.path)),
           arrivals(setup.queue, setup.listener.number()) {}
 
     void waitForConnections() {
@@ -110,7 +105,7 @@ void SocketLocalPort::State::remove(const Session* session) {
 
 void SocketLocalPort::State::close() {
     sessions.clear();
-    if (identityOf(setup.path) == identity) {
+    if (fileAt(setup.path) == identity) {
         (void)::unlink(setup.path.c_str());
     }
 }
