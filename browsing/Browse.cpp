@@ -159,6 +159,11 @@ ExitStatus browseWithLog(const Request& request) {
         complain("Standard input is a terminal; pipe a recording into it.");
         return kExitWrongUsage;
     }
+    const auto loss = recording ? outputIntoRecording({&*recording, 1}) : std::nullopt;
+    if (loss) {
+        complain(*loss);
+        return kExitFailure;
+    }
     std::unique_ptr<ChildService> child;
     if (recording || request.options.simulation) {
         auto started = startChild(request.options);

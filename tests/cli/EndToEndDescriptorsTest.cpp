@@ -73,6 +73,16 @@ TEST_F(EndToEndDescriptors, StandardOutputDoesNotGoIntoARecording) {
     EXPECT_EQ(shell("PALLAX decode - <gsm-attach.pcap >>gsm-attach.pcap 2>err"), 1);
     EXPECT_EQ(contentOf(world.path("err")),
               "pallax: Standard output would go into the recording of standard input.\n");
+    for (const char* line : {"PALLAX gsm-attach.pcap --print --speed max >>gsm-attach.pcap 2>err",
+                             "PALLAX ./gsm-attach.pcap --print >>gsm-attach.pcap 2>err"}) {
+        EXPECT_EQ(shell(line), 1) << line;
+        EXPECT_THAT(contentOf(world.path("err")),
+                    testing::MatchesRegex("pallax: Standard output would go into the recording "
+                                          ".*gsm-attach.pcap.\n"));
+    }
+    EXPECT_EQ(shell("PALLAX - --print <gsm-attach.pcap >>gsm-attach.pcap 2>err"), 1);
+    EXPECT_EQ(contentOf(world.path("err")),
+              "pallax: Standard output would go into the recording of standard input.\n");
     EXPECT_EQ(contentOf(world.path("gsm-attach.pcap")), content);
 }
 
