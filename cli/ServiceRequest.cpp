@@ -54,9 +54,10 @@ void addServiceRelay(CLI::App& app, std::string& relayed, ServiceOptions& option
         ->excludes("--speed") // the stream has its own
         ->excludes("--simulate");
     constexpr double kLongest = 1e6; // eleven days
+    static constexpr const char* kRefusal = "must be a number from 0 to 1000000";
     const auto takePatience = [&options](const double& seconds) {
         if (!(seconds >= 0 && seconds <= kLongest)) {
-            throw CLI::ValidationError("--wait", "must be a number from 0 to 1000000");
+            throw CLI::ValidationError("--wait", kRefusal);
         }
         options.relayPatience = std::chrono::duration_cast<std::chrono::nanoseconds>(
             std::chrono::duration<double>(seconds));
@@ -65,6 +66,8 @@ void addServiceRelay(CLI::App& app, std::string& relayed, ServiceOptions& option
            "--wait", takePatience,
            "How long a relayed stream waits for its first client (default: 10)")
         ->type_name("SECONDS")
+        // The library reads an empty text as 0.
+        ->check([](const std::string& text) { return text.empty() ? kRefusal : ""; })
         ->needs("--relay");
 }
 

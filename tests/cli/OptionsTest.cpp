@@ -278,7 +278,7 @@ TEST(Options, WrongUsageOfTheServiceAndTheRecorderIsOneClearSentence) {
     EXPECT_EQ(
         wrongUsage({"service", "--relay", "a.pcap"}),
         "pallax: --relay: only -, standard input, can be relayed (see pallax service --help)\n");
-    for (const char* seconds : {"-1", "1000001", "nan"}) {
+    for (const char* seconds : {"-1", "1000001", "nan", ""}) {
         EXPECT_EQ(
             wrongUsage({"service", "--relay", "-", "--wait", seconds}),
             "pallax: --wait: must be a number from 0 to 1000000 (see pallax service --help)\n");
