@@ -1,7 +1,5 @@
-#include <gmock/gmock.h>
-#include <gtest/gtest.h>
+#include "tests/doubles/TestRun.h"
 
 int main(int argc, char** argv) {
-    testing::InitGoogleMock(&argc, argv);
-    return RUN_ALL_TESTS();
+    return pallax::doubles::runTests(argc, argv);
 }

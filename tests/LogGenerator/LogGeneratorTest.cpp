@@ -4,10 +4,10 @@
 #include "tests/doubles/FakeGenerator.h"
 #include "tests/doubles/GeneratorFixture.h"
 #include "tests/doubles/InOrder.h"
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordingLog.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 namespace pallax {
 namespace {
@@ -146,7 +146,8 @@ TEST_F(LogGeneratorTest, With7EntriesAlreadyPresentOneCallLeavesTheNewest4AndThe
 }
 
 TEST_F(LogGeneratorTest, AnyHistoryKeepsItsNewestEntriesInOrder) {
-    EXPECT_TRUE(rc::check([&](const std::vector<std::string>& before) {
+    EXPECT_TRUE(doubles::holds([&] {
+        const std::vector<std::string> before = doubles::any::texts();
         state = Dictionary{{"History", Array(before.begin(), before.end())}};
         updateHistory();
         Array expected(before.begin(), before.end());

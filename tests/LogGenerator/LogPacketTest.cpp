@@ -1,10 +1,10 @@
 #include "LogGenerator/LogPacket.h"
 
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordBuilder.h"
 #include "tests/doubles/RecordingLog.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 namespace pallax {
 namespace {
@@ -69,8 +69,9 @@ TEST(LogPacketGetLogCode, ChecksNeitherLengthNorLogType) {
 }
 
 TEST(LogPacketProperty, StrippingAPrefixedMessageGivesItBack) {
-    EXPECT_TRUE(rc::check("prefix on, prefix off", [](const ByteBuffer& record, std::uint8_t any) {
-        ByteBuffer message = {0x81, any};
+    EXPECT_TRUE(doubles::holds([] {
+        const ByteBuffer record = doubles::any::bytes();
+        ByteBuffer message = {0x81, doubles::any::byte()};
         message.insert(message.end(), record.begin(), record.end());
         RC_ASSERT(stripped(message) == record);
     }));

@@ -1,4 +1,5 @@
 #include "tests/cli/EndToEnd.h"
+#include "tests/doubles/Pattern.h"
 
 #include <gtest/gtest.h>
 
@@ -6,7 +7,6 @@
 #include <csignal>
 #include <filesystem>
 #include <fstream>
-#include <regex>
 #include <sstream>
 
 namespace pallax {
@@ -65,7 +65,7 @@ std::vector<std::string> linesFrom(const std::string& log, const std::string& te
     std::istringstream stream(log);
     for (std::string line; std::getline(stream, line);) {
         if (!lines.empty() || line.find(text) != std::string::npos) {
-            lines.push_back(std::regex_replace(line, std::regex("0x[0-9a-f]+"), "0xADDRESS"));
+            lines.push_back(doubles::replaced(line, "0x[0-9a-f]+", "0xADDRESS"));
         }
     }
     return lines;

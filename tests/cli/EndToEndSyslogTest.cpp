@@ -1,5 +1,6 @@
 #include "host/Descriptor.h"
 #include "tests/cli/EndToEndScreen.h"
+#include "tests/doubles/Pattern.h"
 #include "tests/doubles/Shell.h"
 
 #include <algorithm>
@@ -8,7 +9,6 @@
 #include <csignal>
 #include <fstream>
 #include <poll.h>
-#include <regex>
 #include <sys/socket.h>
 #include <sys/un.h>
 #include <thread>
@@ -96,10 +96,10 @@ private:
 
     /// Without the time, the process number and addresses.
     static std::string shortened(const std::string& message) {
-        static const std::regex kHead(
-            R"(^(<[0-9]+>)[A-Z][a-z]{2} [ 0-9]{2} [0-9:]{8} pallax\[[0-9]+\]: )");
-        static const std::regex kAddress("0x[0-9a-f]{6,}");
-        return std::regex_replace(std::regex_replace(message, kHead, "$1"), kAddress, "0xADDRESS");
+        const auto* const head =
+            R"(^(<[0-9]+>)[A-Z][a-z]{2} [ 0-9]{2} [0-9:]{8} pallax\[[0-9]+\]: )";
+        return doubles::replaced(doubles::replaced(message, head, "$1"), "0x[0-9a-f]{6,}",
+                                 "0xADDRESS");
     }
 
     Descriptor socket;

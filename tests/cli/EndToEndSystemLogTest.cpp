@@ -1,7 +1,6 @@
 #include "tests/cli/EndToEnd.h"
 #include "tests/doubles/Files.h"
-
-#include <regex>
+#include "tests/doubles/Pattern.h"
 
 namespace pallax {
 namespace {
@@ -12,7 +11,7 @@ class EndToEndSystemLog : public EndToEnd {};
 
 /// The text with every address in it replaced.
 std::string withoutAddresses(const std::string& text) {
-    return std::regex_replace(text, std::regex("0x[0-9a-f]{6,}"), "0xADDRESS");
+    return doubles::replaced(text, "0x[0-9a-f]{6,}", "0xADDRESS");
 }
 
 TEST_F(EndToEndSystemLog, OfTheSampleHoldsEveryLineInOrder) {

@@ -1,8 +1,9 @@
 #include "decoding/DisplayJson.h"
 
+#include "tests/doubles/Property.h"
+
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
-#include <rapidcheck.h>
 
 #include <cmath>
 #include <limits>
@@ -95,7 +96,8 @@ TEST(DisplayJson, BeyondTheDepthLimitStandsNull) {
 }
 
 TEST(DisplayJson, AnyTextReadsBackAsItself) {
-    EXPECT_TRUE(rc::check([](const std::string& text) {
+    EXPECT_TRUE(doubles::holds([] {
+        const std::string text = doubles::any::text();
         std::string out;
         appendJsonString(out, text);
         const auto parsed = nlohmann::json::parse(out).get<std::string>();
@@ -112,8 +114,10 @@ TEST(DisplayJson, AnyTextReadsBackAsItself) {
 }
 
 TEST(DisplayJson, AnyNumberReadsBackAsItself) {
-    EXPECT_TRUE(rc::check([](double number, std::int64_t integer) {
-        RC_PRE(std::isfinite(number));
+    EXPECT_TRUE(doubles::holds([] {
+        const double number = doubles::any::real();
+        const std::int64_t integer = doubles::any::integer();
+        doubles::require(std::isfinite(number));
         RC_ASSERT(nlohmann::json::parse(json(PropertyList::real(number))).get<double>() == number);
         RC_ASSERT(nlohmann::json::parse(json(PropertyList::integer(integer))).get<std::int64_t>() ==
                   integer);

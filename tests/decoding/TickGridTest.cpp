@@ -3,7 +3,6 @@
 #include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 namespace pallax {
 namespace {
@@ -100,7 +99,7 @@ TEST(TickGrid, TheWholeRangeOfTimeIsOneStep) {
 
 TEST(TickGrid, GivesWhatSteppingGives) {
     EXPECT_TRUE(doubles::holds([] {
-        const auto steps = *rc::gen::container<std::vector<int>>(rc::gen::inRange(-6000, 9000));
+        const auto steps = doubles::any::integers(-6000, 9000);
         TickGrid grid;
         Time packet = kFirstStamp;
         Time latest = kFirstStamp;

@@ -1,9 +1,9 @@
 #include "tests/docs/SourceTree.h"
+#include "tests/doubles/Pattern.h"
 
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <regex>
 #include <set>
 #include <string>
 #include <vector>
@@ -15,6 +15,8 @@ namespace {
 
 namespace fs = std::filesystem;
 using doubles::folderOf;
+using doubles::matchesIn;
+using doubles::replaced;
 using doubles::sourceFiles;
 using doubles::sourceText;
 
@@ -24,13 +26,10 @@ bool isInvented(const std::string& path) {
 }
 
 /// Everything that the pattern's group finds outside of fenced blocks.
-std::set<std::string> found(const std::string& document, const std::regex& pattern) {
-    static const std::regex fenced("```[^`]*```");
-    const std::string text = std::regex_replace(document, fenced, "");
+std::set<std::string> found(const std::string& document, const std::string& pattern) {
     std::set<std::string> texts;
-    for (std::sregex_iterator match(text.begin(), text.end(), pattern), end; match != end;
-         ++match) {
-        texts.insert((*match)[1]);
+    for (const auto& match : matchesIn(replaced(document, "```[^`]*```", ""), pattern)) {
+        texts.insert(match[1]);
     }
     return texts;
 }
@@ -52,7 +51,7 @@ void forEachDocument(const Look& look) {
 }
 
 TEST(Paths, BetweenBackticksExist) {
-    const std::regex withFolder("`([A-Za-z0-9_.-]+(?:/[A-Za-z0-9_.-]+)*/[A-Za-z0-9_.-]*)`");
+    const std::string withFolder = "`([A-Za-z0-9_.-]+(?:/[A-Za-z0-9_.-]+)*/[A-Za-z0-9_.-]*)`";
     forEachDocument([&](const std::string& folder, const std::string& text) {
         for (const std::string& path : found(text, withFolder)) {
             EXPECT_TRUE(isInvented(path) || exists("", path) || exists(folder, path)) << path;
@@ -61,7 +60,7 @@ TEST(Paths, BetweenBackticksExist) {
 }
 
 TEST(Paths, ThatAreFileNamesAreOfSomeFile) {
-    const std::regex fileName("`([A-Za-z0-9_-]+\\.(?:h|cpp|plist|lua|md))`");
+    const std::string fileName = "`([A-Za-z0-9_-]+\\.(?:h|cpp|plist|lua|md))`";
     std::set<std::string> names;
     for (const std::string& path : sourceFiles({".h", ".cpp", ".plist", ".lua", ".md"})) {
         names.insert(fs::path(path).filename().string());
@@ -74,7 +73,7 @@ TEST(Paths, ThatAreFileNamesAreOfSomeFile) {
 }
 
 TEST(Paths, ThatAreLinkedToExist) {
-    const std::regex link("\\]\\(([^)#:]+)\\)");
+    const std::string link = "\\]\\(([^)#:]+)\\)";
     forEachDocument([&](const std::string& folder, const std::string& text) {
         for (const std::string& path : found(text, link)) {
             EXPECT_TRUE(exists(folder, path)) << path;

@@ -1,10 +1,7 @@
 #pragma once
 
+#include "tests/doubles/Property.h"
 #include "tests/doubles/SubpacketBuilder.h"
-
-#include <rapidcheck.h>
-
-#include <cstdint>
 
 namespace pallax::doubles {
 
@@ -12,8 +9,8 @@ namespace pallax::doubles {
 inline Subpacket anySubpacket(unsigned id) {
     constexpr int kMaximumBytes = 60;
     Subpacket subpacket(id);
-    for (int count = *rc::gen::inRange(0, kMaximumBytes); count > 0; --count) {
-        subpacket.u8(*rc::gen::arbitrary<std::uint8_t>());
+    for (int count = any::between(0, kMaximumBytes); count > 0; --count) {
+        subpacket.u8(any::byte());
     }
     return subpacket;
 }

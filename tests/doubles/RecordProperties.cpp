@@ -1,12 +1,13 @@
 #include "tests/doubles/RecordProperties.h"
 
 #include "platform/TelephonyConstants.h"
+#include "tests/doubles/Property.h"
 #include "tests/doubles/PropertyListRecord.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <algorithm>
+#include <array>
 
 namespace pallax::doubles {
 
@@ -42,12 +43,11 @@ PropertyList propertyList(const std::vector<std::string>& keys, int depth) {
     constexpr int kMostElements = 4;
     switch (between(0, depth > 0 ? 8 : 6)) {
     case 0:
-        return *rc::gen::container<std::string>(rc::gen::inRange('a', 'z'));
+        return textOf("abcdefghijklmnopqrstuvwxy");
     case 1:
         return PropertyList::integer(integer());
     case 2:
-        return PropertyList::real(*rc::gen::map(rc::gen::arbitrary<std::int32_t>(),
-                                                [](std::int32_t any) { return any / 8.0; }));
+        return PropertyList::real(static_cast<std::int32_t>(integer()) / 8.0);
     case 3:
         return PropertyList::boolean(boolean());
     case 4:
@@ -95,16 +95,17 @@ PropertyList cell() {
         }
     }
     if (between(0, 8) != 0) {
-        cell.setFixed(kHXCellMonitorCellRadioAccessTechnology,
-                      Text::fixed(*rc::gen::element(kHXCellMonitorRadioAccessTechnologyGSM,
-                                                    kHXCellMonitorRadioAccessTechnologyUMTS,
-                                                    kHXCellMonitorRadioAccessTechnologyLTE,
-                                                    kHXCellMonitorRadioAccessTechnologyUTRAN2)));
+        cell.setFixed(
+            kHXCellMonitorCellRadioAccessTechnology,
+            Text::fixed(elementOf(std::array{kHXCellMonitorRadioAccessTechnologyGSM,
+                                             kHXCellMonitorRadioAccessTechnologyUMTS,
+                                             kHXCellMonitorRadioAccessTechnologyLTE,
+                                             kHXCellMonitorRadioAccessTechnologyUTRAN2})));
     }
     if (between(0, 8) != 0) {
         cell.setFixed(kHXCellMonitorCellType,
-                      Text::fixed(*rc::gen::element(kHXCellMonitorCellTypeServing,
-                                                    kHXCellMonitorCellTypeNeighbor)));
+                      Text::fixed(elementOf(std::array{kHXCellMonitorCellTypeServing,
+                                                       kHXCellMonitorCellTypeNeighbor})));
     }
     return cell;
 }
@@ -116,10 +117,10 @@ void checkKeepsWithin(const std::set<std::string>& keys, const std::vector<LogCo
     EXPECT_TRUE(holds([&keys, &codes, &makeBytes, &fresh] {
         const FedRecord record = fresh();
         for (int count = any::between(1, 4); count > 0; --count) {
-            const LogCode code = *rc::gen::elementOf(codes);
+            const LogCode code = any::elementOf(codes);
             const ByteBuffer bytes = makeBytes(code);
             if (record.feedThrows(bytes, code)) {
-                RC_TAG("thrown");
+                RC_CLASSIFY(true, "thrown");
             }
             RC_ASSERT(keepsWithin(record.fixture->section(), keys));
             (void)record.fixture->section().description(); // makes every text once

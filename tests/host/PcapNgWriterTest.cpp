@@ -3,10 +3,10 @@
 #include "host/AsioMainQueue.h"
 #include "host/Interruption.h"
 #include "host/Recording.h"
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RuntimeFolder.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <algorithm>
 #include <array>
@@ -96,12 +96,13 @@ TEST_F(PcapNgWriterTest, IsReadBackToTheNanosecondWhileItIsBeingWritten) {
 }
 
 TEST_F(PcapNgWriterTest, WhateverIsWrittenIsReadBack) {
-    EXPECT_TRUE(rc::check([this](const std::vector<std::vector<std::uint8_t>>& packets) {
+    EXPECT_TRUE(doubles::holds([this] {
+        const std::vector<ByteBuffer> packets = doubles::any::buffers();
         const auto writer = create(Existing::Overwrite);
         RC_ASSERT(!begin(*writer));
         std::vector<Time> times;
         for (const auto& packet : packets) {
-            const auto stamp = *rc::gen::inRange<std::int64_t>(0, std::int64_t{1} << 62U);
+            const auto stamp = doubles::any::longBetween(0, std::int64_t{1} << 62U);
             times.emplace_back(std::chrono::nanoseconds(stamp));
             RC_ASSERT(!writer->write(times.back(), packet));
         }

@@ -1,7 +1,8 @@
 #include "host/PortFrame.h"
 
+#include "tests/doubles/Property.h"
+
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <limits>
 
@@ -153,20 +154,22 @@ TEST(PortFrame, AfterAFaultNothingIsTaken) {
 }
 
 TEST(PortFrame, WhateverIsFramedIsParsedAgain) {
-    EXPECT_TRUE(rc::check([](const std::vector<ByteBuffer>& messages, std::int32_t identifier) {
+    EXPECT_TRUE(doubles::holds([] {
+        const std::vector<ByteBuffer> messages = doubles::any::buffers();
+        const auto identifier = static_cast<std::int32_t>(doubles::any::bits());
         ByteBuffer stream;
         std::vector<PortFrame> expected;
         for (const ByteBuffer& message : messages) {
             FrameHeader header = headerOf(FrameKind::Message, identifier);
-            header.isLive = *rc::gen::arbitrary<bool>();
+            header.isLive = doubles::any::boolean();
             header.sourceTime = Time(std::chrono::nanoseconds(
-                *rc::gen::inRange<std::int64_t>(std::numeric_limits<std::int64_t>::min() + 1,
-                                                std::numeric_limits<std::int64_t>::max())));
+                doubles::any::longBetween(std::numeric_limits<std::int64_t>::min() + 1,
+                                          std::numeric_limits<std::int64_t>::max())));
             appendFrame(stream, header, message);
             expected.push_back({header, message});
         }
         PortFrameParser parser;
-        const auto size = *rc::gen::inRange<std::size_t>(1, 100);
+        const auto size = 1 + doubles::any::index(99);
         RC_ASSERT(framesOf(parser, stream, size) == expected);
     }));
 }

@@ -2,12 +2,12 @@
 #include "cli/Completion.h"
 #include "cli/ManualPage.h"
 #include "tests/doubles/Files.h"
+#include "tests/doubles/Pattern.h"
 #include "tests/doubles/Shell.h"
 
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <regex>
 #include <set>
 
 namespace pallax {
@@ -79,7 +79,6 @@ TEST_F(Installation, EveryManualPageAndCompletionIsThere) {
 }
 
 TEST_F(Installation, WhatTheDocumentsLeadToIsThere) {
-    const std::regex link("\\]\\(([^)#:]+)\\)");
     std::size_t links = 0;
     for (const std::string& name : files("share/doc/pallax")) {
         if (!name.ends_with(".md")) {
@@ -87,9 +86,9 @@ TEST_F(Installation, WhatTheDocumentsLeadToIsThere) {
         }
         const std::string text = contentOf(prefix.path("share/doc/pallax/" + name));
         const fs::path folder = fs::path(prefix.path("share/doc/pallax/" + name)).parent_path();
-        for (std::sregex_iterator match(text.begin(), text.end(), link), end; match != end;
-             ++match, ++links) {
-            EXPECT_TRUE(fs::exists(folder / match->str(1))) << name << ": " << match->str(1);
+        for (const auto& link : doubles::matchesIn(text, "\\]\\(([^)#:]+)\\)")) {
+            EXPECT_TRUE(fs::exists(folder / link[1])) << name << ": " << link[1];
+            ++links;
         }
     }
     EXPECT_GE(links, 10U) << "the README, the tour and the tables of the records lead to others";

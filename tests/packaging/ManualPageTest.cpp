@@ -3,25 +3,25 @@
 #include "cli/CommandLine.h"
 #include "cli/HelpText.h"
 #include "tests/doubles/Files.h"
+#include "tests/doubles/Pattern.h"
 #include "tests/doubles/Shell.h"
 #include "ui/terminal/KeyHelp.h"
 
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <regex>
 
 namespace pallax {
 namespace {
 
 using doubles::contentOf;
 using doubles::isInstalled;
+using doubles::replaced;
 using doubles::runCommand;
 
 /// The page's text without roff's marks.
 std::string plain(const std::string& page) {
-    return std::regex_replace(std::regex_replace(page, std::regex(R"(\\f[BIR])"), ""),
-                              std::regex(R"(\\-)"), "-");
+    return replaced(replaced(page, R"(\\f[BIR])", ""), R"(\\-)", "-");
 }
 
 CommandDescription program() {
@@ -49,9 +49,7 @@ TEST(ManualPage, EveryOptionIsOnItsPageWithItsValueAndDescription) {
             }
             const std::string item =
                 ".TP\n" + names + (option.value.empty() ? "" : " " + option.value) + "\n";
-            EXPECT_NE(page.find(item +
-                                std::regex_replace(option.description, std::regex("'"), "\\(aq") +
-                                ".\n"),
+            EXPECT_NE(page.find(item + replaced(option.description, "'", "\\(aq") + ".\n"),
                       std::string::npos)
                 << item << option.description << "\n"
                 << page;

@@ -2,9 +2,9 @@
 
 #include "plist/PropertyList.h"
 #include "tests/doubles/InOrder.h"
+#include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <string>
 #include <utility>
@@ -56,19 +56,19 @@ private:
 };
 
 TEST(DictionaryProperty, WhateverIsDoneToItItHoldsWhatAPlainListWould) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         Dictionary dictionary;
         Model model;
-        const auto steps = *rc::gen::inRange(0, 120);
+        const auto steps = doubles::any::between(0, 120);
         for (int step = 0; step < steps; ++step) {
-            const std::string key = std::to_string(*rc::gen::inRange(0, 40));
+            const std::string key = std::to_string(doubles::any::between(0, 40));
             const std::string value = std::to_string(step);
-            switch (*rc::gen::inRange(0, 12)) {
+            switch (doubles::any::between(0, 12)) {
             case 0:
                 RC_ASSERT(dictionary.remove(key) == model.remove(key));
                 break;
             case 1: {
-                const auto count = *rc::gen::inRange<std::size_t>(0, 50);
+                const auto count = doubles::any::index(50);
                 dictionary.truncate(count);
                 model.truncate(count);
                 break;

@@ -2,9 +2,9 @@
 
 #include "plist/PropertyListCodec.h"
 #include "tests/doubles/InOrder.h"
+#include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <string>
 #include <vector>
@@ -120,16 +120,16 @@ std::string randomXml() {
                                                      "<array></array>",
                                                      "<key>M</key><array><true/></array>"};
     std::string value;
-    const auto count = *rc::gen::inRange<std::size_t>(0, 12);
-    for (std::size_t index = 0; index < count; ++index) {
-        value += kPieces[*rc::gen::inRange<std::size_t>(0, kPieces.size())];
+    for (int count = doubles::any::between(0, 12); count > 0; --count) {
+        value += doubles::any::elementOf(kPieces);
     }
-    return listOf(*rc::gen::element<std::string>("", "<dict>", "<array>") + value +
-                  *rc::gen::element<std::string>("", "</dict>", "</array>"));
+    const std::vector<std::string> openings = {"", "<dict>", "<array>"};
+    const std::vector<std::string> endings = {"", "</dict>", "</array>"};
+    return listOf(doubles::any::elementOf(openings) + value + doubles::any::elementOf(endings));
 }
 
 TEST(PlainXmlReader, WhatItReadsTheWholeReaderReadsAlike) {
-    EXPECT_TRUE(rc::check([] {
+    EXPECT_TRUE(doubles::holds([] {
         const std::string xml = randomXml();
         const auto plain = readPlainXml(xml);
         const auto whole = wholeReading(xml);

@@ -3,98 +3,83 @@
 #include "text/Utf8.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
+#include <array>
 #include <bit>
 #include <cmath>
 
 namespace pallax {
 namespace {
 
+namespace any = doubles::any;
+
 /// Which values a form can hold.
 enum class Reach { kBinary, kXml, kText };
 
-/// With up to so many elements, that nested containers stay small.
-template <class Container>
-rc::Gen<Container> sized(rc::Gen<Container> generator) {
+/// How many elements a container or text has: few, so that nested ones stay small.
+int anyCount() {
     constexpr int kMostElements = 5;
-    return rc::gen::resize(kMostElements, std::move(generator));
+    return any::between(0, kMostElements + 1);
 }
 
-/// Numbers of any size, however few elements surround them.
-template <class Number>
-rc::Gen<Number> fullRange(rc::Gen<Number> generator) {
-    return rc::gen::resize(rc::kNominalSize, std::move(generator));
-}
-
-rc::Gen<std::string> texts(Reach reach) {
-    const auto codePoint =
-        rc::gen::map(rc::gen::oneOf(fullRange(rc::gen::inRange<std::uint32_t>(0, 0x80)),
-                                    fullRange(rc::gen::inRange<std::uint32_t>(0x80, 0x3000)),
-                                    fullRange(rc::gen::inRange<std::uint32_t>(0xE000, 0x110000))),
-                     [reach](std::uint32_t number) {
-                         const bool control =
-                             number < 0x20 && number != '\t' && number != '\n' && number != '\r';
-                         return reach == Reach::kXml && control ? U'?' : char32_t{number};
-                     });
-    return rc::gen::map(sized(rc::gen::container<std::vector<char32_t>>(codePoint)),
-                        [](const std::vector<char32_t>& codePoints) {
-                            std::string text;
-                            for (const char32_t next : codePoints) {
-                                appendUtf8(text, next);
-                            }
-                            return text;
-                        });
-}
-
-rc::Gen<PropertyList> scalars(Reach reach) {
-    auto strings =
-        rc::gen::map(texts(reach), [](std::string text) { return PropertyList(std::move(text)); });
-    auto data = rc::gen::map(
-        sized(rc::gen::container<ByteBuffer>(fullRange(rc::gen::arbitrary<std::uint8_t>()))),
-        [](ByteBuffer bytes) { return PropertyList::data(std::move(bytes)); });
-    if (reach == Reach::kText) {
-        return rc::gen::oneOf(strings, data);
+std::string anyText(Reach reach) {
+    struct Range {
+        std::int64_t low;
+        std::int64_t high;
+    };
+    constexpr auto kRanges = std::to_array<Range>({{0, 0x80}, {0x80, 0x3000}, {0xE000, 0x110000}});
+    std::string text;
+    for (int count = anyCount(); count > 0; --count) {
+        const Range range = any::elementOf(kRanges);
+        const auto number = static_cast<char32_t>(any::longBetween(range.low, range.high));
+        const bool control = number < 0x20 && number != '\t' && number != '\n' && number != '\r';
+        appendUtf8(text, reach == Reach::kXml && control ? U'?' : number);
     }
-    const auto integer = [](std::int64_t number) { return PropertyList::integer(number); };
-    const auto real = [](std::uint64_t bits) {
-        const auto number = std::bit_cast<double>(bits);
-        return PropertyList::real(std::isnan(number) ? 0.1 : number);
-    };
-    const auto boolean = [](bool truth) { return PropertyList::boolean(truth); };
-    const auto date = [](std::int64_t seconds) {
-        return PropertyList(Date(std::chrono::seconds(seconds)));
-    };
+    return text;
+}
+
+PropertyList anyScalar(Reach reach) {
     constexpr std::int64_t kYear0 = -62167219200;
     constexpr std::int64_t kYear10000 = 253402300800;
-    return rc::gen::oneOf(
-        strings, data, rc::gen::map(fullRange(rc::gen::arbitrary<std::int64_t>()), integer),
-        rc::gen::map(fullRange(rc::gen::inRange<std::int64_t>(-300, 70000)), integer),
-        rc::gen::map(fullRange(rc::gen::arbitrary<std::uint64_t>()),
-                     [](std::uint64_t number) { return PropertyList::unsignedInteger(number); }),
-        rc::gen::map(fullRange(rc::gen::arbitrary<std::uint64_t>()), real),
-        rc::gen::map(rc::gen::arbitrary<bool>(), boolean),
-        rc::gen::map(fullRange(rc::gen::inRange<std::int64_t>(kYear0, kYear10000)), date));
+    switch (any::between(0, reach == Reach::kText ? 2 : 8)) {
+    case 0:
+        return anyText(reach);
+    case 1:
+        return PropertyList::data(any::bytesBelow(256, static_cast<std::size_t>(anyCount())));
+    case 2:
+        return PropertyList::integer(static_cast<std::int64_t>(any::bits()));
+    case 3:
+        return PropertyList::integer(any::longBetween(-300, 70000));
+    case 4:
+        return PropertyList::unsignedInteger(any::bits());
+    case 5: {
+        const auto number = std::bit_cast<double>(any::bits());
+        return PropertyList::real(std::isnan(number) ? 0.1 : number);
+    }
+    case 6:
+        return PropertyList::boolean(any::boolean());
+    default:
+        return Date(std::chrono::seconds(any::longBetween(kYear0, kYear10000)));
+    }
 }
 
-rc::Gen<PropertyList> values(Reach reach, int depth) {
-    if (depth == 0) {
-        return scalars(reach);
+PropertyList anyValue(Reach reach, int depth) {
+    const int kind = depth == 0 ? 0 : any::between(0, 3);
+    if (kind == 0) {
+        return anyScalar(reach);
     }
-    const auto inner = values(reach, depth - 1);
-    return rc::gen::oneOf(
-        scalars(reach),
-        rc::gen::map(sized(rc::gen::container<Array>(inner)),
-                     [](Array elements) { return PropertyList(std::move(elements)); }),
-        rc::gen::map(sized(rc::gen::container<std::vector<std::pair<std::string, PropertyList>>>(
-                         rc::gen::pair(texts(reach), inner))),
-                     [](const std::vector<std::pair<std::string, PropertyList>>& pairs) {
-                         Dictionary entries;
-                         for (const auto& [key, value] : pairs) {
-                             entries.set(key, value);
-                         }
-                         return PropertyList(std::move(entries));
-                     }));
+    if (kind == 1) {
+        Array elements;
+        for (int count = anyCount(); count > 0; --count) {
+            elements.push_back(anyValue(reach, depth - 1));
+        }
+        return elements;
+    }
+    Dictionary entries;
+    for (int count = anyCount(); count > 0; --count) {
+        entries.set(anyText(reach), anyValue(reach, depth - 1));
+    }
+    return entries;
 }
 
 constexpr int kDepth = 3;
@@ -143,7 +128,7 @@ void appendAsText(std::string& out, const PropertyList& object) {
 
 TEST(PropertyListRoundTrip, XmlReadsBackAsItWasWritten) {
     EXPECT_TRUE(doubles::holds([] {
-        const PropertyList list = *values(Reach::kXml, kDepth);
+        const PropertyList list = anyValue(Reach::kXml, kDepth);
         const auto xml = serializeXml(list);
         RC_ASSERT(refusalOf(xml) == "");
         const auto back = parsePropertyList(bytesOf(*xml));
@@ -155,7 +140,7 @@ TEST(PropertyListRoundTrip, XmlReadsBackAsItWasWritten) {
 
 TEST(PropertyListRoundTrip, BinaryReadsBackAsItWasWritten) {
     EXPECT_TRUE(doubles::holds([] {
-        const PropertyList list = *values(Reach::kBinary, kDepth);
+        const PropertyList list = anyValue(Reach::kBinary, kDepth);
         const auto bytes = serializeBinary(list);
         RC_ASSERT(refusalOf(bytes) == "");
         const auto back = parsePropertyList(*bytes);
@@ -167,7 +152,7 @@ TEST(PropertyListRoundTrip, BinaryReadsBackAsItWasWritten) {
 
 TEST(PropertyListRoundTrip, TextReadsBackAsItWasWritten) {
     EXPECT_TRUE(doubles::holds([] {
-        const PropertyList list = *values(Reach::kText, kDepth);
+        const PropertyList list = anyValue(Reach::kText, kDepth);
         std::string text;
         appendAsText(text, list);
         const auto back = parsePropertyList(bytesOf(text));

@@ -1,6 +1,7 @@
 #include "platform/TelephonyConstants.h"
 #include "plist/PropertyListCodec.h"
 #include "simulator/common/PropertyListRecord.h"
+#include "tests/doubles/Pattern.h"
 #include "tests/doubles/RecordBuilder.h"
 #include "tests/doubles/Shell.h"
 #include "tests/doubles/TextPropertyList.h"
@@ -12,7 +13,6 @@
 #include <algorithm>
 #include <map>
 #include <ostream>
-#include <regex>
 #include <string>
 #include <vector>
 
@@ -45,17 +45,16 @@ Marks marked(const std::string& recording, const std::string& filter) {
     EXPECT_EQ(run.status, 0);
     const std::string packet = run.out.substr(0, run.out.find("</packet>"));
     const std::string section = filter.substr(0, filter.rfind('.'));
-    const std::regex field("<field name=\"" + section +
-                           "\\.[^\"]*\" showname=\"([^\":]*): [^\"]*\" size=\"([0-9]+)\" "
-                           "pos=\"([0-9]+)\"");
+    const std::string field("<field name=\"" + section +
+                            "\\.[^\"]*\" showname=\"([^\":]*): [^\"]*\" size=\"([0-9]+)\" "
+                            "pos=\"([0-9]+)\"");
     Marks marks;
-    for (std::sregex_iterator found(packet.begin(), packet.end(), field), end; found != end;
-         ++found) {
-        std::string key = (*found)[1];
+    for (const auto& found : doubles::matchesIn(packet, field)) {
+        std::string key = found[1];
         if (const std::size_t at = key.find("&lt;"); at != std::string::npos) {
             key.replace(at, 4, "<");
         }
-        marks.emplace(key, MarkedBytes{std::stoul((*found)[3]), std::stoul((*found)[2])});
+        marks.emplace(key, MarkedBytes{std::stoul(found[3]), std::stoul(found[2])});
     }
     return marks;
 }

@@ -2,7 +2,6 @@
 #include "tests/doubles/Shell.h"
 #include "tests/reference/DisplayComparison.h"
 
-#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <map>

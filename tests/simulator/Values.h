@@ -3,8 +3,6 @@
 #include "tests/doubles/Property.h"
 #include "tests/simulator/SimulatedPhone.h"
 
-#include <rapidcheck.h> // for RC_ASSERT
-
 #include <string>
 #include <vector>
 

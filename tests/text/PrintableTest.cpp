@@ -4,7 +4,6 @@
 #include "text/Utf8.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 namespace pallax {
 namespace {

@@ -7,8 +7,6 @@
 #include "tests/doubles/Property.h"
 #include "tests/doubles/RecordProperties.h"
 
-#include <rapidcheck.h>
-
 #include <algorithm>
 #include <string>
 #include <vector>
@@ -132,10 +130,10 @@ inline Record anyPacket(LogCode code, const std::vector<std::size_t>& lengths) {
     constexpr unsigned kSmall = 5;
     constexpr unsigned kAny = 256;
     const std::size_t largest = *std::max_element(lengths.begin(), lengths.end());
-    const auto length = *rc::gen::arbitrary<bool>()
-                            ? *rc::gen::elementOf(lengths)
-                            : *rc::gen::inRange(LogRecord::kHeaderLength, largest + 1);
-    const unsigned bound = *rc::gen::element(kSmall, kAny);
+    const auto length = any::boolean() ? any::elementOf(lengths)
+                                       : LogRecord::kHeaderLength +
+                                             any::index(largest + 1 - LogRecord::kHeaderLength);
+    const unsigned bound = any::boolean() ? kSmall : kAny;
     const ByteBuffer payload = any::bytesBelow(bound, length - LogRecord::kHeaderLength);
     return Record(code).append(Bytes(payload));
 }
@@ -146,7 +144,7 @@ inline void anyPacketWritesOnly(LogCode code, const std::vector<std::string>& na
     EXPECT_TRUE(doubles::holds([&names, code, &lengths] {
         C2KFixture fixture;
         fixture.mark();
-        for (int count = *rc::gen::inRange(1, 4); count > 0; --count) {
+        for (int count = any::between(1, 4); count > 0; --count) {
             fixture.feed(anyPacket(code, lengths));
         }
         for (const Dictionary::Entry& row : fixture.written()) {

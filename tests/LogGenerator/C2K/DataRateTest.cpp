@@ -1,5 +1,6 @@
 #include "LogGenerator/C2K/DataRate.h"
 
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
@@ -113,10 +114,14 @@ TEST_F(DataRateTest, WithoutExtraInformationTheRateIsShownAllTheSame) {
 }
 
 TEST_F(DataRateTest, TheRateIsTheDifferenceOfTotalsOverThatOfSequenceNumbers) {
-    EXPECT_TRUE(rc::check([](std::uint32_t first, std::uint32_t second) {
+    EXPECT_TRUE(doubles::holds([] {
+        const auto first = static_cast<std::uint32_t>(doubles::any::bits());
+        const auto second = doubles::any::boolean()
+                                ? static_cast<std::uint32_t>(doubles::any::bits())
+                                : first + doubles::any::below(100);
         Dictionary state;
-        const std::int64_t sent = *rc::gen::inRange<std::int64_t>(0, 1LL << 48U);
-        const std::int64_t later = *rc::gen::inRange<std::int64_t>(0, 1LL << 48U);
+        const std::int64_t sent = doubles::any::longBetween(0, 1LL << 48U);
+        const std::int64_t later = doubles::any::longBetween(0, 1LL << 48U);
         (void)dataRateSince(kNames, first, sent, state);
         const PropertyList rate = dataRateSince(kNames, second, later, state);
         const DisplayNumber* shown = rate.displayNumber();

@@ -111,11 +111,11 @@ TEST(FingerC2I, TheRatioIsComputedInDoublePrecision) {
 TEST(FingerC2I, AnyFingersWriteOnlyItsRow) {
     EXPECT_TRUE(doubles::holds([] {
         C2KFixture fixture;
-        std::vector<Finger> any;
-        for (int count = *rc::gen::inRange(0, 6); count > 0; --count) {
-            any.push_back({*rc::gen::inRange(0U, 0x10000U), *rc::gen::inRange(0U, 0x10000U)});
+        std::vector<Finger> drawn;
+        for (int count = any::between(0, 6); count > 0; --count) {
+            drawn.push_back({any::below(0x10000), any::below(0x10000)});
         }
-        const Dictionary rows = fixture.writtenBy(fingers(any));
+        const Dictionary rows = fixture.writtenBy(fingers(drawn));
         RC_ASSERT(rows.size() == 1U);
         RC_ASSERT(rows.contains("kFingerC2I"));
         (void)fixture.value("kFingerC2I").description();

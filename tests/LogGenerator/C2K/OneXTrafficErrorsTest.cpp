@@ -74,10 +74,10 @@ TEST(OneXTrafficErrors, TheAverageIsComputedInSinglePrecision) {
 }
 
 TEST(OneXTrafficErrors, TheRateKeepsBetween0And1) {
-    EXPECT_TRUE(rc::check([](const std::vector<bool>& frames) {
+    EXPECT_TRUE(doubles::holds([] {
         Dictionary state;
-        for (const bool inError : frames) {
-            const float rate = addTrafficFrame(inError, state);
+        for (int count = doubles::any::between(0, 100); count > 0; --count) {
+            const float rate = addTrafficFrame(doubles::any::boolean(), state);
             RC_ASSERT(rate >= 0.0F);
             RC_ASSERT(rate <= 1.0F);
         }

@@ -8,7 +8,6 @@
 #include "tests/doubles/RecordingLog.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <array>
 
@@ -309,9 +308,9 @@ TEST(GSMLogGeneratorProperty, AValueOfAnotherTypeAnywhereLeavesTheStateAsItWas) 
         Stream stream;
         stream.feed(xmlMessage(anyMessage()));
         const std::string before = PropertyList(stream.state).description();
-        PropertyList object = PropertyList::integer(*rc::gen::arbitrary<int>());
-        for (int depth = *rc::gen::inRange(1, 8); depth > 0; --depth) {
-            switch (*rc::gen::inRange(0, 3)) {
+        PropertyList object = PropertyList::integer(doubles::any::integer());
+        for (int depth = doubles::any::between(1, 8); depth > 0; --depth) {
+            switch (doubles::any::between(0, 3)) {
             case 0:
                 object = Dictionary{{"K", object}};
                 break;
@@ -335,16 +334,16 @@ TEST(GSMLogGeneratorProperty, AnyBytesAreDisplayedOrLeaveTheStateAsItWas) {
         const std::string before = PropertyList(stream.state).description();
         const PropertyList object = anyMessage();
         const std::array forms = {xmlMessage(object), binaryMessage(object), textMessage(object)};
-        ByteBuffer message = forms.at(*rc::gen::inRange<std::size_t>(0, forms.size()));
+        ByteBuffer message = forms.at(doubles::any::index(forms.size()));
         // A message with a byte changed, or cut.
-        const auto at = *rc::gen::inRange<std::size_t>(0, message.size());
-        if (*rc::gen::arbitrary<bool>()) {
-            message[at] = *rc::gen::arbitrary<std::uint8_t>();
+        const auto at = doubles::any::index(message.size());
+        if (doubles::any::boolean()) {
+            message[at] = doubles::any::byte();
         } else {
             message.resize(at);
         }
         if (stream.failureOf(message) != "none") {
-            RC_TAG("refused");
+            RC_CLASSIFY(true, "refused");
             RC_ASSERT(PropertyList(stream.state).description() == before);
         } else {
             // As texts: a number that is none equals nothing, not even itself.

@@ -1,9 +1,8 @@
 #pragma once
 
 #include "plist/PropertyListCodec.h"
+#include "tests/doubles/Property.h"
 #include "tests/doubles/TextPropertyList.h"
-
-#include <rapidcheck.h>
 
 #include <string>
 #include <string_view>
@@ -31,11 +30,18 @@ inline ByteBuffer textMessage(const PropertyList& object) {
 /// are frequent, for they are what collapses.
 inline PropertyList anyObject(int depth, bool withArrays = true) {
     constexpr int kMostEntries = 4;
-    const int kind = *rc::gen::inRange(0, depth > 0 ? 6 : 1);
+    static const std::string kLetters = [] {
+        std::string letters;
+        for (char letter = ' '; letter < '~'; ++letter) {
+            letters += letter;
+        }
+        return letters;
+    }();
+    const int kind = doubles::any::between(0, depth > 0 ? 6 : 1);
     if (kind == 0) {
-        return *rc::gen::container<std::string>(rc::gen::inRange(' ', '~'));
+        return doubles::any::textOf(kLetters);
     }
-    const int count = *rc::gen::inRange(0, kMostEntries);
+    const int count = doubles::any::between(0, kMostEntries);
     if (kind < 3 && withArrays) {
         Array elements;
         for (int index = 0; index < count; ++index) {
@@ -45,7 +51,7 @@ inline PropertyList anyObject(int depth, bool withArrays = true) {
     }
     Dictionary entries;
     for (int index = 0; index < count; ++index) {
-        entries.set(Text(std::string(1, static_cast<char>('A' + *rc::gen::inRange(0, 26)))),
+        entries.set(Text(std::string(1, static_cast<char>('A' + doubles::any::between(0, 26)))),
                     anyObject(depth - 1, withArrays));
     }
     return entries;

@@ -3,7 +3,6 @@
 #include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <algorithm>
 
@@ -233,7 +232,7 @@ TEST(ProcessObjectProperty, TheTopLevelKeepsItsKeysAndTheObjectItsContent) {
 TEST(ProcessObjectProperty, AnArrayIsShorterByOne) {
     EXPECT_TRUE(doubles::holds([] {
         Array elements;
-        for (int count = *rc::gen::inRange(0, 6); count > 0; --count) {
+        for (int count = doubles::any::between(0, 6); count > 0; --count) {
             elements.push_back(anyObject(2));
         }
         const std::size_t shown = elements.empty() ? 0 : elements.size() - 1;
@@ -252,7 +251,7 @@ TEST(ProcessObjectProperty, AnyChainFoldsToItsInnermostValue) {
     EXPECT_TRUE(doubles::holds([] {
         const PropertyList innermost = anyObject(2);
         PropertyList chain = innermost;
-        for (int links = *rc::gen::inRange(1, 40); links > 0; --links) {
+        for (int links = doubles::any::between(1, 40); links > 0; --links) {
             chain = Dictionary{{"link", chain}};
         }
         PropertyList expected = processed(innermost);

@@ -1,10 +1,10 @@
 #include "LogGenerator/LTE/ReselectionCandidatesList.h"
 
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 namespace pallax {
 namespace {
@@ -200,10 +200,9 @@ TEST(ReselectionCandidatesList, AnyBytesKeepItsEntriesWithinItsKeys) {
     // Of any bytes, few are a technology: the same with technologies that are mostly known.
     anyRecordsKeepWithin<ReselectionCandidatesList, NothingThrown>(
         keys, codesOf<ReselectionCandidatesList>(), [](LogCode) {
-            Record record = candidatesHead(*rc::gen::inRange(0U, 12U));
-            for (const unsigned word :
-                 *rc::gen::container<std::vector<unsigned>>(rc::gen::inRange(0U, 7U))) {
-                record.u16(word);
+            Record record = candidatesHead(any::below(12));
+            for (const int word : any::integers(0, 7)) {
+                record.u16(static_cast<unsigned>(word));
             }
             return record.bytes();
         });

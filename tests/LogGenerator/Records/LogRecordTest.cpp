@@ -1,7 +1,8 @@
 #include "LogGenerator/Records/LogRecord.h"
 
+#include "tests/doubles/Property.h"
+
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 namespace pallax {
 namespace {
@@ -60,11 +61,12 @@ TEST(LogRecord, PayloadFollowsTheHeader) {
 }
 
 TEST(LogRecordProperty, AnyBitFieldEqualsItsBitsOneByOne) {
-    EXPECT_TRUE(rc::check("bit by bit", [](const ByteBuffer& bytes) {
+    EXPECT_TRUE(doubles::holds([] {
+        const ByteBuffer bytes = doubles::any::bytes();
         const LogRecord record(bytes);
-        const auto byte = *rc::gen::inRange<std::size_t>(0, bytes.size() + 4);
-        const auto bit = *rc::gen::inRange(0U, 8U);
-        const auto width = *rc::gen::inRange(1U, 33U);
+        const auto byte = doubles::any::index(bytes.size() + 4);
+        const auto bit = doubles::any::below(8);
+        const auto width = 1 + doubles::any::below(32);
         std::int64_t expected = 0;
         for (unsigned index = 0; index < width; ++index) {
             const unsigned place = bit + index;

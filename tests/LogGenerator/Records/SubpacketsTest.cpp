@@ -101,15 +101,15 @@ TEST(Subpackets, AHeaderThatThePacketCutsIsReadAsFarAsItGoes) {
 TEST(Subpackets, WhateverIsFoundHasItsIdAndLiesInThePacket) {
     EXPECT_TRUE(doubles::holds([] {
         std::vector<Subpacket> subpackets;
-        for (int count = *rc::gen::inRange(1, 6); count > 0; --count) {
-            subpackets.push_back(anySubpacket(*rc::gen::inRange(1U, 5U)));
-            if (*rc::gen::inRange(0, 4) == 0) {
-                subpackets.back().claim(*rc::gen::inRange(0U, 100U));
+        for (int count = any::between(1, 6); count > 0; --count) {
+            subpackets.push_back(anySubpacket(1 + any::below(4)));
+            if (any::between(0, 4) == 0) {
+                subpackets.back().claim(any::below(100));
             }
         }
         ByteBuffer bytes = packetOf(0x119C, subpackets).bytes();
-        bytes.resize(*rc::gen::inRange<std::size_t>(kSubpacketsStart, bytes.size() + 1));
-        const auto id = *rc::gen::inRange<std::uint8_t>(1, 5);
+        bytes.resize(kSubpacketsStart + any::index(bytes.size() + 1 - kSubpacketsStart));
+        const auto id = static_cast<std::uint8_t>(any::between(1, 5));
         const LogRecord packet{Bytes(bytes)};
         if (const auto found = findSubpacket(packet, id)) {
             RC_ASSERT(found->u8(0) == id);

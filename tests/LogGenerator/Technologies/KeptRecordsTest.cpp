@@ -2,11 +2,11 @@
 #include "LogGenerator/UTRAN/UTRANClassIndex.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
 #include "tests/doubles/FakeStandardOutput.h"
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordProperties.h"
 #include "tests/doubles/RecordingLog.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <exception>
 
@@ -47,7 +47,7 @@ PropertyList emptySection(const Base& record) {
 
 /// One code many times in a row, mostly, so that its records are kept.
 LogCode anyCodeAfter(LogCode before, const std::vector<LogCode>& codes) {
-    return any::between(0, 3) != 0 ? before : *rc::gen::elementOf(codes);
+    return any::between(0, 3) != 0 ? before : any::elementOf(codes);
 }
 
 /// Two of the same record class get the same log records: one reads each when it arrives, the other
@@ -59,7 +59,7 @@ void checkRecord(Base& prompt, Base& late) {
     late.updateSectionRef(shownLate);
     const std::span<const LogCode> subscribed = prompt.getLogCodeArray();
     const std::vector<LogCode> codes(subscribed.begin(), subscribed.end());
-    LogCode code = codes.empty() ? 0 : *rc::gen::elementOf(codes);
+    LogCode code = codes.empty() ? 0 : any::elementOf(codes);
     for (int count = codes.empty() ? 0 : any::between(1, 12); count > 0; --count) {
         code = anyCodeAfter(code, codes);
         const ByteBuffer bytes = doubles::anyCellsRecord(code);

@@ -1,10 +1,10 @@
 #include "LogGenerator/UTRAN/CCTRCHSIRMeasurement.h"
 
+#include "tests/doubles/Property.h"
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 namespace pallax {
 namespace {
@@ -116,11 +116,11 @@ TEST(CCTRCHSIRMeasurement, AnyBytesKeepItsEntriesWithinItsKeys) {
     const std::set<std::string> keys = {"CCTRCH ID", "TSNUM", "SIR"};
     anyBytesKeepWithin<CCTRCHSIRMeasurement>(keys);
     // Behind the fixed distance to the first entry.
-    anyRecordsKeepWithin<CCTRCHSIRMeasurement,
-                         NothingThrown>(keys, codesOf<CCTRCHSIRMeasurement>(), [](LogCode) {
-        const auto transport = *rc::gen::inRange(0U, 64U);
-        return channels(transport, *rc::gen::inRange(0U, 16U)).append(any::recordBytes()).bytes();
-    });
+    anyRecordsKeepWithin<CCTRCHSIRMeasurement, NothingThrown>(
+        keys, codesOf<CCTRCHSIRMeasurement>(), [](LogCode) {
+            const auto transport = any::below(64);
+            return channels(transport, any::below(16)).append(any::recordBytes()).bytes();
+        });
 }
 
 } // namespace

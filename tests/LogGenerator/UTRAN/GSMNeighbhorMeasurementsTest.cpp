@@ -5,7 +5,6 @@
 #include "tests/doubles/RecordProperties.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 namespace pallax {
 namespace {

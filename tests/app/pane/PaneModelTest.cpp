@@ -4,7 +4,8 @@
 #include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
+
+#include <array>
 
 namespace pallax {
 namespace {
@@ -188,28 +189,29 @@ TEST_F(PaneModelTest, OfARowItsValueIsCopiedAndOfABranchItsName) {
 TEST_F(PaneModelTest, WhateverHappensTheCursorIsOnARow) {
     EXPECT_TRUE(doubles::holds([this] {
         using By = PaneOrder::By;
-        const auto names = rc::gen::container<std::vector<std::string>>(
-            rc::gen::element<std::string>("A", "B", "C", "xA", "xB", "xC"));
-        const int steps = *rc::gen::inRange(1, 30);
+        constexpr auto kNames = std::to_array<const char*>({"A", "B", "C", "xA", "xB", "xC"});
+        constexpr auto kFilters = std::to_array<const char*>({"", "x", "a", "q"});
+        const int steps = any::between(1, 30);
         for (int step = 0; step < steps; ++step) {
-            switch (*rc::gen::inRange(0, 4)) {
+            switch (any::between(0, 4)) {
             case 0: {
                 std::vector<NodeRef> rows;
-                for (const std::string& name : *names) {
-                    rows.push_back(leafNode(name, *rc::gen::element<std::string>("1", "2")));
+                for (const int name : any::integers(0, kNames.size())) {
+                    rows.push_back(leafNode(kNames.at(static_cast<std::size_t>(name)),
+                                            any::boolean() ? "1" : "2"));
                 }
                 pane.show(treeNode("Section", std::move(rows)));
                 break;
             }
             case 1:
-                pane.moveCursorTo(*rc::gen::inRange<std::size_t>(0, 9));
+                pane.moveCursorTo(any::index(9));
                 break;
             case 2:
-                pane.setFilter(*rc::gen::element<std::string>("", "x", "a", "q"));
+                pane.setFilter(any::elementOf(kFilters));
                 break;
             default:
-                pane.setOrder({*rc::gen::element(By::Display, By::Name, By::Value),
-                               *rc::gen::arbitrary<bool>()});
+                pane.setOrder({any::elementOf(std::to_array({By::Display, By::Name, By::Value})),
+                               any::boolean()});
                 break;
             }
             const std::size_t count = pane.shownRows();

@@ -3,9 +3,9 @@
 #include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <algorithm>
+#include <array>
 #include <limits>
 #include <numeric>
 
@@ -104,14 +104,14 @@ TEST(PaneOrderTest, TheCursorGoesWithItsRow) {
 TEST(PaneOrderTest, InAnyOrderEveryRowIsShownOnce) {
     EXPECT_TRUE(doubles::holds([] {
         std::vector<NodeRef> rows;
-        const auto numbers = *rc::gen::container<std::vector<int>>(rc::gen::inRange(-3, 3));
+        const std::vector<int> numbers = any::integers(-3, 3);
         for (const int number : numbers) {
             rows.push_back(number < 0 ? leafNode("text", std::to_string(number))
                                       : leafNode("number", dbm(number)));
         }
         PaneModel pane(treeNode("Section", rows), "/Section");
         pane.setOrder(
-            {*rc::gen::element(By::Display, By::Name, By::Value), *rc::gen::arbitrary<bool>()});
+            {any::elementOf(std::to_array({By::Display, By::Name, By::Value})), any::boolean()});
         std::vector<std::size_t> order;
         for (std::size_t at = 0; at < pane.shownRows(); ++at) {
             order.push_back(pane.rowAt(at));

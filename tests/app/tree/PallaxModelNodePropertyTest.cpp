@@ -2,12 +2,13 @@
 #include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <unordered_set>
 
 namespace pallax {
 namespace {
+
+namespace any = doubles::any;
 
 constexpr int kDeepest = 4;
 constexpr int kWidest = 6;
@@ -15,11 +16,11 @@ constexpr int kWidest = 6;
 /// A display object of strings, dictionaries and arrays; every dictionary is sorted or not, and
 /// names hold separators, slashes and repetitions.
 PropertyList randomObject(int depth) {
-    const int kind = *rc::gen::inRange(0, depth > 0 ? 3 : 1);
+    const int kind = any::between(0, depth > 0 ? 3 : 1);
     if (kind == 0) {
-        return *rc::gen::arbitrary<std::string>();
+        return any::text();
     }
-    const int count = *rc::gen::inRange(0, kWidest);
+    const int count = any::between(0, kWidest);
     if (kind == 1) {
         Array array;
         for (int at = 0; at < count; ++at) {
@@ -28,12 +29,11 @@ PropertyList randomObject(int depth) {
         return array;
     }
     Dictionary dictionary;
-    if (*rc::gen::arbitrary<bool>()) {
+    if (any::boolean()) {
         dictionary.set("_sorted", "1");
     }
     for (int at = 0; at < count; ++at) {
-        const auto key =
-            *rc::gen::container<std::string>(rc::gen::element('a', 'B', '1', ';', '/'));
+        const std::string key = any::textOf("aB1;/");
         dictionary.set(key, randomObject(depth - 1));
     }
     return dictionary;
@@ -108,7 +108,8 @@ TEST(PallaxModelNodeProperty, EveryValueHasExactlyOneNodeOfItsKind) {
 }
 
 TEST(PallaxModelNodeProperty, SortedRowsAreInAscendingOrderOfTheirKeys) {
-    EXPECT_TRUE(rc::check([](const std::vector<std::string>& keys) {
+    EXPECT_TRUE(doubles::holds([] {
+        const std::vector<std::string> keys = any::texts();
         Dictionary object{{"_sorted", "1"}};
         for (const std::string& key : keys) {
             object.set(key, key); // the value remembers the key

@@ -4,7 +4,6 @@
 #include "tests/ui/terminal/GridSupport.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <string>
 #include <utility>
@@ -166,32 +165,29 @@ TEST(GridTest, TheCursorIsWhereItWasSet) {
 }
 
 /// Texts of narrow, wide, combining, control and broken characters.
-rc::Gen<std::string> texts() {
-    const auto pieces =
-        rc::gen::element<std::string>("a", " ", "漢", "語", "😀", "한", "\u1161", "\u0301", "\u200d",
-                                      "\x1b", "\xff", "\xe6\xbc", "\u0085");
-    return rc::gen::map(rc::gen::container<std::vector<std::string>>(pieces),
-                        [](const std::vector<std::string>& chosen) {
-                            std::string text;
-                            for (const std::string& piece : chosen) {
-                                text += piece;
-                            }
-                            return text;
-                        });
+std::string anyText() {
+    constexpr auto kPieces =
+        std::to_array<const char*>({"a", " ", "漢", "語", "😀", "한", "\u1161", "\u0301", "\u200d",
+                                    "\x1b", "\xff", "\xe6\xbc", "\u0085"});
+    std::string text;
+    for (const int piece : any::integers(0, kPieces.size())) {
+        text += kPieces.at(static_cast<std::size_t>(piece));
+    }
+    return text;
 }
 
 TEST(GridTest, WhateverIsPutWhereverEveryRowFillsItsColumns) {
     EXPECT_TRUE(doubles::holds([] {
-        Grid grid(*rc::gen::inRange(0, 12), *rc::gen::inRange(0, 3));
-        const int puts = *rc::gen::inRange(1, 40);
+        Grid grid(any::between(0, 12), any::between(0, 3));
+        const int puts = any::between(1, 40);
         for (int count = 0; count < puts; ++count) {
-            const int x = *rc::gen::inRange(-4, 14);
-            const int y = *rc::gen::inRange(-1, 3);
-            const std::string text = *texts();
-            const Span clip{*rc::gen::inRange(-3, 8), *rc::gen::inRange(0, 14)};
+            const int x = any::between(-4, 14);
+            const int y = any::between(-1, 3);
+            const std::string text = anyText();
+            const Span clip{any::between(-3, 8), any::between(0, 14)};
             RC_ASSERT(grid.put(x, y, text, {}, clip) == x + columnsOf(text));
-            if (*rc::gen::inRange(0, 4) == 0) {
-                grid.clear(*rc::gen::inRange(-3, 12), y, *rc::gen::inRange(0, 6), 1);
+            if (any::between(0, 4) == 0) {
+                grid.clear(any::between(-3, 12), y, any::between(0, 6), 1);
             }
             RC_ASSERT(faultOf(grid) == "");
         }

@@ -5,7 +5,6 @@
 #include "ui/terminal/TerminalToolkit.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <algorithm>
 #include <initializer_list>
@@ -251,31 +250,32 @@ TEST_F(TerminalTableTest, HasNoCellToSpare) {
 
 TEST_F(TerminalTableTest, WhateverHappensTheCursorIsOnARowInTheWindow) {
     EXPECT_TRUE(doubles::holds([this] {
-        const auto names = rc::gen::container<std::vector<std::string>>(
-            rc::gen::element<std::string>("A", "B", "C", "xA", "xB", "xC"));
-        const int steps = *rc::gen::inRange(1, 30);
+        constexpr auto kNames = std::to_array<const char*>({"A", "B", "C", "xA", "xB", "xC"});
+        constexpr auto kFilters = std::to_array<const char*>({"", "x", "a", "q"});
+        const int steps = any::between(1, 30);
         for (int step = 0; step < steps; ++step) {
-            switch (*rc::gen::inRange(0, 6)) {
+            switch (any::between(0, 6)) {
             case 0: {
                 std::vector<NodeRef> rows;
-                for (const std::string& name : *names) {
-                    rows.push_back(doubles::leafNode(name, std::string(40, 'v')));
+                for (const int name : any::integers(0, kNames.size())) {
+                    rows.push_back(doubles::leafNode(kNames.at(static_cast<std::size_t>(name)),
+                                                     std::string(40, 'v')));
                 }
                 source.show(std::move(rows));
                 table.reloadData();
                 break;
             }
             case 1:
-                table.moveCursor(*rc::gen::inRange(-9, 9));
+                table.moveCursor(any::between(-9, 9));
                 break;
             case 2:
-                table.setFilter(*rc::gen::element<std::string>("", "x", "a", "q"));
+                table.setFilter(any::elementOf(kFilters));
                 break;
             case 3:
-                show(*rc::gen::inRange<std::size_t>(0, 8), *rc::gen::inRange(0, 100));
+                show(any::index(8), any::between(0, 100));
                 break;
             case 4:
-                (void)table.scrollSideways(*rc::gen::inRange(-20, 20));
+                (void)table.scrollSideways(any::between(-20, 20));
                 break;
             default:
                 table.moveToEnd();

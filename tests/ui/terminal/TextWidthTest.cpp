@@ -1,10 +1,10 @@
 #include "ui/terminal/TextWidth.h"
 
+#include "tests/doubles/Property.h"
 #include "text/Printable.h"
 #include "text/Utf8.h"
 
 #include <gtest/gtest.h>
-#include <rapidcheck.h>
 
 #include <clocale>
 #include <ostream>
@@ -91,7 +91,8 @@ TEST(TextWidthTest, DoesNotDependOnTheLocale) {
 }
 
 TEST(TextWidthTest, ClustersCoverAnyBytesWithPrintableTextOfOneOrTwoColumns) {
-    EXPECT_TRUE(rc::check([](const std::string& bytes) {
+    EXPECT_TRUE(doubles::holds([] {
+        const std::string bytes = doubles::any::text();
         std::size_t offset = 0;
         int columns = 0;
         for (const Cluster& cluster : clustersOf(bytes)) {
