@@ -26,15 +26,15 @@ using Array = std::vector<PropertyList>;
 using ArrayRef = std::shared_ptr<Array>;
 using DictionaryRef = std::shared_ptr<Dictionary>;
 
-/// The typed tree that the whole system exchanges: commands, templates, displays, state,
-/// injected records and snapshot files.
+/// The value type of the whole system: commands, templates, displays, state, injected records and
+/// snapshot files.
 ///
-/// Copying shares arrays and dictionaries: two copies see each other's changes to a container.
-/// A string may be a display number (a number with its format); to every reader it is a string
-/// like any other, whose text is made when it is asked for.
+/// Copies share arrays and dictionaries: a change to a container is visible through both copies. A
+/// string may be a display number (a number with its format), which readers see as an ordinary
+/// string; its text is formatted on demand.
 class PropertyList {
 public:
-    // With a "k", for the plain names are the types themselves.
+    // Prefixed with "k" because the plain names are types.
     enum class Type {
         kNull,
         kString,
@@ -48,7 +48,7 @@ public:
     };
 
     PropertyList() = default;
-    // Not inline: what a variant of ten types makes of them is large, and every file copies some.
+    // Not inline: the variant's code for ten types is large, and every file copies some.
     PropertyList(const PropertyList& other);
     PropertyList(PropertyList&& other) noexcept;
     PropertyList& operator=(const PropertyList& other);
@@ -72,7 +72,7 @@ public:
     static PropertyList data(ByteBuffer bytes);
 
     Type type() const;
-    /// The type's name as a diagnostic gives it: "string", "integer", "dictionary", …
+    /// The type's name in diagnostics: "string", "integer", "dictionary", …
     std::string_view typeName() const;
     bool isNull() const { return type() == Type::kNull; }
     bool isString() const { return type() == Type::kString; }
@@ -81,45 +81,45 @@ public:
     std::optional<std::string> string() const;
     /// Appends the text of a string; false (and nothing appended) for any other type.
     bool appendString(std::string& out) const;
-    /// The text of a string that is no display number, or null for everything else.
+    /// The text of a string that is not a display number, otherwise null.
     const Text* text() const { return std::get_if<Text>(&_value); }
-    /// The number behind a display string, or null for everything else.
+    /// The number of a display string, otherwise null.
     const DisplayNumber* displayNumber() const { return std::get_if<DisplayNumber>(&_value); }
 
     std::optional<std::int64_t> integer() const { return get<std::int64_t>(); }
-    /// An integer that only 64 bits without a sign can hold; nothing for every other value.
+    /// An integer that only fits unsigned 64 bits; nothing for any other value.
     std::optional<std::uint64_t> largeInteger() const { return get<std::uint64_t>(); }
     std::optional<double> real() const { return get<double>(); }
     std::optional<bool> boolean() const { return get<bool>(); }
     std::optional<Date> date() const { return get<Date>(); }
-    SharedBytes data() const; ///< null when this is no data value
-    /// Null when this is no array.
+    SharedBytes data() const; ///< null if this is not a data value
+    /// Null if this is not an array.
     ArrayRef array() const {
         const auto* array = std::get_if<ArrayRef>(&_value);
         return array != nullptr ? *array : nullptr;
     }
-    /// Null when this is no dictionary.
+    /// Null if this is not a dictionary.
     DictionaryRef dictionary() const {
         const auto* dictionary = std::get_if<DictionaryRef>(&_value);
         return dictionary != nullptr ? *dictionary : nullptr;
     }
 
-    /// Becomes what is given; where it was of that kind before, at the cost of a plain copy.
+    /// Assigns the value; at the cost of a plain copy if the kind is the same.
     void assign(const DisplayNumber& number) { _value = number; }
     void assign(Text text) { _value = std::move(text); }
 
-    /// The number as a signed 32-bit integer: an integer in range, or a real with a whole value
-    /// in range; nothing otherwise. A string is no number, whatever it reads.
+    /// The number as a signed 32-bit integer: an integer in range, or a real with a whole value in
+    /// range; otherwise nothing. Strings are not converted.
     std::optional<std::int32_t> int32() const;
 
-    /// A one-level copy: a new container that shares its elements; everything else is itself.
+    /// A one-level copy: a new container that shares its elements; any other value itself.
     PropertyList shallowCopy() const;
 
     /// One readable line for log texts: { key = value; }, ( a, b ), <01ff>.
     std::string description() const;
 
-    /// The property-list equality test: same type, same content, at every depth; strings by
-    /// their text, dictionaries whatever their order.
+    /// The property-list equality: same type and same content at every depth; strings by their
+    /// text, dictionaries in any order.
     friend bool operator==(const PropertyList& a, const PropertyList& b);
 
 private:
@@ -136,7 +136,7 @@ private:
     Value _value;
 };
 
-/// String keys to values, in the order in which the keys were first set.
+/// A map from string keys to values that keeps the order in which the keys were first set.
 class Dictionary {
 public:
     struct Entry {
@@ -145,8 +145,8 @@ public:
 
         Text key;
         PropertyList value;
-        /// False for an entry whose key was no string in the source (`key` is its printed form):
-        /// only a walk over the entries meets it.
+        /// False for an entry whose key was not a string in the source (`key` is its printed form):
+        /// lookups do not find it, only iteration.
         bool hasStringKey;
     };
 
@@ -162,12 +162,12 @@ public:
     const PropertyList* find(std::string_view key) const;
     bool contains(std::string_view key) const { return find(key) != nullptr; }
 
-    /// Replaces the value under `key` where it stands, or appends.
+    /// Replaces the value under `key` in place, or appends.
     void set(Text key, PropertyList value);
     /// The same for a key with static storage duration; allocates no key.
     void setFixed(std::string_view key, PropertyList value) { valueToSet(key) = std::move(value); }
-    /// The value under such a key, appended as null where it is not there yet. Valid until the
-    /// next change.
+    /// The value under a key with static storage duration, appended as null if missing. Valid until
+    /// the next change.
     PropertyList& valueToSet(std::string_view key) {
         return _next < _entries.size() && isAt(_next, key) ? _entries[_next++].value
                                                            : searchedOrAppended(key);
@@ -182,12 +182,12 @@ public:
     /// Removes what follows the key set last.
     void dropRest() { truncate(_next); }
     void appendForeignKey(const PropertyList& key, PropertyList value);
-    /// True when there was something to remove.
+    /// True if the key was there.
     bool remove(std::string_view key);
 
     void reserve(std::size_t count) { _entries.reserve(count); }
-    /// Removes all entries but the first `count` and keeps their memory. The next one to be set is
-    /// looked for from the first on.
+    /// Removes all entries but the first `count` and keeps their memory. The search for the next
+    /// key starts at the first entry.
     void truncate(std::size_t count);
     std::size_t size() const { return _entries.size(); }
     bool empty() const { return _entries.empty(); }
@@ -199,7 +199,8 @@ private:
     /// The views point into the entries' keys.
     using Index = std::unordered_map<std::string_view, std::size_t>;
 
-    /// A key from a table is mostly the very text that was set before, and need not be compared.
+    /// A key from a table usually is the text set before; an equal address saves comparing the
+    /// texts.
     bool isAt(std::size_t at, std::string_view key) const {
         const Entry& entry = _entries[at];
         const std::string_view there = entry.key.view();
@@ -213,10 +214,10 @@ private:
     void rebuildIndex();
 
     std::vector<Entry> _entries;
-    /// Kept once a linear search would be slow; null before.
+    /// Built once a linear search would be slow; null before.
     std::unique_ptr<Index> _index;
-    /// Behind the entry that was set last. Whoever sets many keys sets them in their order, so
-    /// that the next one is mostly found here, without a search.
+    /// The entry after the last one set. Callers that set many keys use the same order each time,
+    /// so the next key is usually found here, without a search.
     std::size_t _next = 0;
 };
 

@@ -8,8 +8,8 @@
 
 namespace pallax {
 
-/// How a reader or writer of property lists gives up from the depth of its recursion. Internal
-/// to the codecs: `refusedOr` turns it into the error of a result, none leaves them.
+/// Thrown by a reader or writer of property lists to give up from within its recursion. Internal to
+/// the codecs: `refusedOr` turns it into the error of a result.
 struct Refusal {
     CodecError error;
 };
@@ -18,7 +18,7 @@ struct Refusal {
     throw Refusal{{offset, std::move(reason)}};
 }
 
-/// What `work` returns, or why it refused.
+/// The result of `work`, or the reason for its refusal.
 template <class Output, class Work>
 Result<Output, CodecError> refusedOr(const Work& work) {
     try {
@@ -28,7 +28,7 @@ Result<Output, CodecError> refusedOr(const Work& work) {
     }
 }
 
-/// Refuses, before any work is done, an input that is empty or too large.
+/// Refuses an input that is empty or too large, before reading it.
 inline void requireReadableSize(Bytes bytes) {
     if (bytes.empty()) {
         refuse(0, "an empty input");
@@ -38,7 +38,7 @@ inline void requireReadableSize(Bytes bytes) {
     }
 }
 
-/// `depth` counts the containers around a container, itself included.
+/// `depth` counts the containers around a container, including itself.
 inline void requireDepth(std::size_t offset, std::size_t depth) {
     if (depth > kDeepestPropertyList) {
         refuse(offset, "containers nested deeper than 512");

@@ -6,7 +6,7 @@
 
 namespace pallax {
 
-/// What the phone does with its network, whatever the technology.
+/// The phone's use of its network, for all technologies.
 class Activity {
 public:
     enum class Phase {
@@ -14,7 +14,7 @@ public:
         Searching,
         Registering,
         Idle,
-        Updating,   ///< tells the network in which area it is
+        Updating,   ///< tells the network its area
         Connecting, ///< a data session begins
         Connected,
         Releasing
@@ -22,16 +22,16 @@ public:
 
     explicit Activity(Random& random);
 
-    /// Time goes on by `step`; `newArea`: the camped cell lies in another area than before.
+    /// Advances by `step`; `newArea`: the camped cell is in another area than before.
     void update(std::chrono::milliseconds step, bool newArea, Random& random);
 
     Phase phase() const { return _phase; }
-    /// True when the latest update brought another phase.
+    /// True if the latest update changed the phase.
     bool hasChanged() const { return _hasChanged; }
     bool isRegistered() const { return _phase >= Phase::Idle; }
-    /// Anything goes over the air in both directions.
+    /// Whether data are sent in both directions.
     bool isConnected() const { return _phase == Phase::Connected; }
-    /// Of the data session: 0 (nothing) to 1 (all that the cell can give).
+    /// The load of the data session: 0 (none) to 1 (the cell's maximum).
     double load() const { return _load; }
 
 private:
@@ -42,7 +42,7 @@ private:
     std::chrono::milliseconds _left{0};
     double _load = 0;
     bool _hasChanged = true;
-    bool _updateWaits = false; // a new area was met while another phase went on
+    bool _updateWaits = false; // entered a new area during another phase
     bool _firstIdle = true;
 };
 

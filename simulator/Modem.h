@@ -8,14 +8,14 @@
 
 namespace pallax {
 
-/// Records that an event has brought, to be sent in this order before any report.
+/// The log records of events, to be sent in this order before any report.
 class RecordQueue {
 public:
-    /// Room for one more record, which the caller writes.
+    /// Appends a log record for the caller to write.
     ByteBuffer& add() { return _records.emplace_back(); }
     bool empty() const { return _records.empty(); }
     std::size_t size() const { return _records.size(); }
-    /// The queue is not empty.
+    /// The queue must not be empty.
     void take(ByteBuffer& out) {
         out.swap(_records.front());
         _records.pop_front();
@@ -25,7 +25,7 @@ private:
     std::deque<ByteBuffer> _records;
 };
 
-/// A modem of one technology: puts what happens in a scenario into its log records.
+/// A modem of one technology: turns the events of a scenario into log records.
 class Modem {
 public:
     Modem() = default;
@@ -33,13 +33,11 @@ public:
     Modem& operator=(const Modem&) = delete;
     virtual ~Modem() = default;
 
-    /// Queues the records of what the scenario's latest step has changed. The first call is for
-    /// the first moment.
+    /// Queues the log records for the scenario's latest step. The first call is for the start.
     virtual void observe(const Scenario& scenario, RecordQueue& queue) = 0;
-    /// Writes the next of the reports that come again and again. `random` is that of the reports:
-    /// measurement noise.
+    /// Writes the next periodic report. `random` provides the measurement noise.
     virtual void report(const Scenario& scenario, Random& random, ByteBuffer& out) = 0;
-    /// False for a modem whose messages are no log records.
+    /// False for a modem whose messages are not log records.
     virtual bool sendsRecords() const { return true; }
 };
 

@@ -11,22 +11,22 @@
 
 namespace pallax {
 
-/// What the cells of one radio technology have in common, and how their numbers are given out.
+/// The common properties of a radio technology's cells, and how their numbers are assigned.
 struct LayerPlan {
     unsigned firstChannel = 0;
     unsigned channelStep = 1;
-    unsigned channelCount = 1; ///< so many channels take turns
+    unsigned channelCount = 1; ///< number of channels, used in turn
     unsigned firstCode = 0;
-    unsigned codeCount = 504; ///< no multiple of 101
+    unsigned codeCount = 504; ///< not a multiple of 101
     std::uint32_t firstIdentity = 1;
     std::uint32_t identityStep = 1;
     unsigned firstArea = 1;
-    unsigned sitesPerSide = 6; ///< of a square around the middle
+    unsigned sitesPerSide = 6; ///< of a square around the centre
     double spacing_m = 700;
-    double power_dbm = 30;   ///< radiated, in the bandwidth that the level is told of
-    double least_dbm = -130; ///< what is weaker is not heard
+    double power_dbm = 30;   ///< radiated power in the bandwidth of the level
+    double least_dbm = -130; ///< weaker cells are not heard
     double hillLoss_db = 0;  ///< in the deepest shadow
-    int updateEvery = 1;     ///< steps: what the phone does not serve on it measures less often
+    int updateEvery = 1;     ///< steps between measurements while the layer does not serve
 };
 
 /// A cell's unchanging properties.
@@ -38,30 +38,30 @@ struct Cell {
     PlanePoint position;
 };
 
-/// The cells of one technology and how the phone hears them: path loss over the distance,
-/// shadowing that changes slowly along the way, and the phone's own smoothing. The phone camps on
-/// one of them and leaves it for another that has been better by a hysteresis for a while.
+/// The cells of one technology as the phone hears them: path loss, shadowing that changes slowly
+/// along the route, and smoothing. The phone camps on one cell and leaves it for another that has
+/// been better by a hysteresis for some time.
 class RadioLayer {
 public:
     static constexpr std::size_t kMostHeard = 9;
 
     RadioLayer(const LayerPlan& plan, Random& random, PlanePoint phone);
 
-    /// The phone has moved `moved_m` to `phone`, where a hill shadows it so much (0 to 1).
+    /// The phone has moved by `moved_m` to `phone`, where a hill shadows it by `shadow` (0 to 1).
     void update(PlanePoint phone, double moved_m, double shadow, Random& random);
 
     const std::vector<Cell>& cells() const { return _cells; }
     double level_dbm(std::size_t cell) const { return _levels_dbm[cell]; }
-    /// Of all cells together.
+    /// The total level of all cells.
     double total_dbm() const { return _total_dbm; }
-    /// Where the phone camps. It stays there when nothing is heard.
+    /// The cell on which the phone camps. It does not change while no cell is heard.
     std::size_t camped() const { return _camped; }
     const Cell& campedCell() const { return _cells[_camped]; }
     double campedLevel_dbm() const { return _levels_dbm[_camped]; }
     bool isHeard(std::size_t cell) const { return _levels_dbm[cell] > _plan.least_dbm; }
-    /// True when the latest update brought another camped cell.
+    /// True if the latest update changed the camped cell.
     bool hasChanged() const { return _hasChanged; }
-    /// The other cells that are heard, the strongest first.
+    /// The other audible cells, strongest first.
     std::span<const std::size_t> neighbours() const {
         return {_neighbours.data(), _neighbourCount};
     }

@@ -6,9 +6,9 @@
 
 namespace pallax {
 
-/// Numbers that look random and are the same for the same seed, on every machine: xoshiro256**,
-/// its state filled by splitmix64. The standard's distributions differ between libraries, hence
-/// the few that are needed here.
+/// Pseudo-random numbers that depend only on the seed, on every machine: xoshiro256**, its state
+/// filled by splitmix64. It has its own distributions because those of the standard library differ
+/// between implementations.
 class Random {
 public:
     explicit Random(std::uint64_t seed) {
@@ -29,17 +29,17 @@ public:
         return result;
     }
 
-    /// From 0 up to, not including, 1.
+    /// From 0 to 1, excluding 1.
     double unit() {
         constexpr double kStep = 0x1p-53;
         return static_cast<double>(next() >> 11U) * kStep;
     }
-    /// From `least` up to, not including, `bound`.
+    /// From `least` to `bound`, excluding `bound`.
     double between(double least, double bound) { return least + (bound - least) * unit(); }
-    /// From 0 to `bound` - 1; `bound` is not 0.
+    /// From 0 to `bound` - 1; `bound` must not be 0.
     unsigned below(unsigned bound) { return static_cast<unsigned>((next() >> 32U) * bound >> 32U); }
-    /// Nearly normal, of mean 0 and deviation 1, and never beyond 3.5: the sum of four uniform
-    /// numbers, which one draw gives.
+    /// Approximately normal, with mean 0 and deviation 1, and never beyond 3.5: the sum of four
+    /// uniform numbers from one draw.
     double normal() {
         constexpr double kMean = 2.0 * 65535.0;
         constexpr double kDeviation = 37837.2; // of the sum: 65536 / sqrt(3)

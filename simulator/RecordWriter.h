@@ -7,15 +7,15 @@
 
 namespace pallax {
 
-/// Writes one log record into a buffer, as the log channel delivers it: the 2-byte transport
-/// prefix, the 13-byte header, and then what is put. Numbers are little-endian; offsets count from
-/// byte 0 of the record, which follows the prefix.
+/// Writes one log record into a buffer as the log channel delivers it: the 2-byte transport prefix,
+/// the 13-byte header, and the body. Numbers are little-endian; offsets count from byte 0 of the
+/// log record, after the prefix.
 class RecordWriter {
 public:
     static constexpr std::size_t kPrefixLength = 2;
     static constexpr std::size_t kHeaderLength = 13;
 
-    /// Empties `out`, which outlives the writer. A code from 0xFF0000 on is an extended one.
+    /// Clears `out`, which must outlive the writer. Codes from 0xFF0000 are extended.
     RecordWriter(ByteBuffer& out, std::uint32_t logCode);
 
     RecordWriter& u8(unsigned value) { return put(value, 1); }
@@ -26,15 +26,15 @@ public:
     RecordWriter& s16(int value) { return put(static_cast<unsigned>(value), 2); }
     RecordWriter& s32(std::int32_t value) { return put(static_cast<std::uint32_t>(value), 4); }
     RecordWriter& append(Bytes bytes);
-    /// Zeros up to that offset; nothing when the record is longer already.
+    /// Appends zeros up to the offset, if the log record is shorter.
     RecordWriter& padTo(std::size_t offset);
     RecordWriter& skip(std::size_t bytes) { return padTo(length() + bytes); }
 
-    /// Of the record so far.
+    /// The current length of the log record.
     std::size_t length() const { return _out.size() - kPrefixLength; }
 
-    /// Puts the low `width` bits (at most 32) of `value` into bytes that stand already, from bit
-    /// `bit` of the byte at `offset` on: low bits in lower bytes.
+    /// Sets the low `width` bits (at most 32) of `value` in existing bytes, starting at bit `bit`
+    /// of the byte at `offset`: low bits in lower bytes.
     RecordWriter& bits(std::size_t offset, unsigned bit, unsigned width, unsigned value);
 
 private:
@@ -51,7 +51,7 @@ private:
     ByteBuffer& _out;
 };
 
-/// Writes what no display shows into a record's header: its length, and a time stamp.
+/// Sets the header fields that no display shows: length and time stamp.
 void stampRecord(ByteBuffer& record, std::uint64_t microseconds);
 
 } // namespace pallax

@@ -5,14 +5,14 @@
 
 namespace pallax {
 
-/// Chooses among kinds of reports so that, in the long run, each comes as often as its share
-/// says, and evenly; a kind with the share 0 does not come.
+/// Chooses the kind of the next report so that each kind is evenly spaced and as frequent as its
+/// share; a kind with share 0 never comes.
 template <std::size_t kKinds>
 class ReportMix {
 public:
     using Shares = std::array<int, kKinds>;
 
-    /// The kind of the next report; at least one share is above 0.
+    /// The kind of the next report; at least one share must be above 0.
     std::size_t next(const Shares& shares) {
         int sum = 0;
         std::size_t chosen = 0;

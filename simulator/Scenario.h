@@ -11,7 +11,7 @@
 
 namespace pallax {
 
-/// When the phone leaves its first layer for the second one, and when it returns.
+/// When the phone leaves its first layer for the second, and when it returns.
 struct Fallback {
     double leave_dbm;
     double return_dbm;
@@ -19,29 +19,29 @@ struct Fallback {
 
 struct ScenarioPlan {
     std::vector<LayerPlan> layers;    ///< the phone starts on the first
-    std::optional<Fallback> fallback; ///< without one it stays there
+    std::optional<Fallback> fallback; ///< if missing, the phone stays there
 };
 
-/// A phone in a car among cells: where it is, what it hears, and what it does. One model for all
-/// technologies, which differ in their layers only. The same seed gives the same drive.
+/// A phone in a car among cells: its position, what it hears, and what it does. One model for all
+/// technologies, which differ only in their layers. The same seed gives the same drive.
 class Scenario {
 public:
     static constexpr std::chrono::milliseconds kStep{200};
 
     Scenario(const ScenarioPlan& plan, std::uint64_t seed);
 
-    /// `kStep` passes.
+    /// Advances by `kStep`.
     void step();
 
     std::chrono::milliseconds now() const { return _now; }
     const Activity& activity() const { return _activity; }
     const RadioLayer& layer(std::size_t index) const { return _layers[index]; }
-    /// Which of the layers serves.
+    /// The index of the serving layer.
     std::size_t servingLayer() const { return _servingLayer; }
     const RadioLayer& serving() const { return _layers[_servingLayer]; }
-    /// The latest step brought another serving cell. So does the first moment.
+    /// The latest step changed the serving cell. Also true at the start.
     bool hasNewServingCell() const { return _hasNewServingCell; }
-    /// The latest step brought another serving layer. So does the first moment.
+    /// The latest step changed the serving layer. Also true at the start.
     bool hasNewLayer() const { return _hasNewLayer; }
 
 private:

@@ -9,9 +9,8 @@
 
 namespace pallax {
 
-/// Writes a simulation with a duration as a recording to `path` ("-" is standard output), where
-/// an existing file is replaced. The sentence that tells why not, if it could not. `written`, if
-/// any, gets each packet's time.
+/// Writes a simulation with a duration as a recording to `path` ("-" is standard output), replacing
+/// an existing file. Returns an error on failure. `written`, if any, receives each packet's time.
 std::optional<HostError>
 writeSimulatedRecording(const SimulationOptions& options, const std::string& path,
                         const std::function<void(Time time)>& written = {});

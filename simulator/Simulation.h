@@ -17,24 +17,24 @@ namespace pallax {
 
 struct RecordedTechnology;
 
-/// What to simulate.
+/// The options of a simulation.
 struct SimulationOptions {
     static constexpr unsigned kUsualRate = 40;
 
     const RecordedTechnology* technology = nullptr; ///< one of `simulatedTechnologies`
     std::uint64_t seed = 1;
-    unsigned packetsPerSecond = kUsualRate;       ///< from 1 on
-    std::optional<std::chrono::seconds> duration; ///< without one it never ends
+    unsigned packetsPerSecond = kUsualRate;       ///< at least 1
+    std::optional<std::chrono::seconds> duration; ///< if missing, it never ends
 };
 
 /// The technologies that can be simulated, in the order in which they are offered.
 std::span<const RecordedTechnology* const> simulatedTechnologies();
 
-/// A simulated modem's packets, one after the other, for ever. The same options give the same
-/// packets at the same times; the rate changes how often is reported, not what happens.
+/// The packets of a simulated modem, endlessly. The same options give the same packets at the same
+/// times; the rate changes how often the modem reports, not what happens.
 class Simulation {
 public:
-    /// When every simulation begins: 2023-11-14 22:13:20 UTC.
+    /// The start of every simulation: 2023-11-14 22:13:20 UTC.
     static constexpr Time kStart{std::chrono::seconds{1700000000}};
 
     struct Packet {
@@ -44,7 +44,7 @@ public:
 
     explicit Simulation(const SimulationOptions& options);
 
-    /// Nothing once the duration is over.
+    /// Nothing after the duration.
     std::optional<Packet> next();
 
 private:
@@ -56,7 +56,7 @@ private:
     Random _reports;
     RecordQueue _queue;
     ByteBuffer _record;
-    std::chrono::nanoseconds _slot; // time from one packet to the next, on average
+    std::chrono::nanoseconds _slot; // average time between packets
     std::uint64_t _count = 0;
 };
 

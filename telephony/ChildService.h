@@ -12,33 +12,32 @@
 
 namespace pallax {
 
-/// The first argument of the program that makes it the child service. The program's `main` looks
-/// for it before anything else and then returns `runChildService`.
+/// The first argument that makes the program the child service. `main` checks for it before
+/// anything else and then returns `runChildService`.
 inline constexpr std::string_view kChildServiceCommand = "--child-service";
 
-/// A telephony service of one's own, in a child process that ends with this one: the same program,
-/// started anew, with port names that no other process uses.
+/// A private telephony service, in a child process that ends with this one: the same program,
+/// started again, with port names that no other process uses.
 class ChildService {
 public:
-    /// Starts it and waits until clients can connect; fails with the child's own sentence. The
-    /// control port's name in `options` does not matter. A recording "-" is read by the child, from
-    /// `input` or else this process's standard input; this waits until the stream's header has
-    /// come.
+    /// Starts it and waits until clients can connect; fails with the child's error. The control
+    /// port's name in `options` is ignored. For the recording "-", the child reads `input` or this
+    /// process's standard input, and this function waits for the stream's header.
     static Result<std::unique_ptr<ChildService>, HostError> start(ServiceOptions options,
                                                                   Descriptor input = Descriptor());
-    /// As `stop`.
+    /// Calls `stop`.
     ~ChildService();
     ChildService(const ChildService&) = delete;
     ChildService& operator=(const ChildService&) = delete;
 
     const std::string& controlPortName() const { return _controlPortName; }
-    /// `base` as a local port's name that only this process uses.
+    /// A local port's name, made from `base`, that only this process uses.
     std::string privateName(std::string_view base) const;
     pid_t processId() const { return _process; }
 
-    /// Ends the child and removes what it may have left. Does nothing the second time.
+    /// Ends the child and removes files that it left. The second call does nothing.
     void stop();
-    /// What the child has complained of since it was ready, line by line.
+    /// The child's messages since it was ready, line by line.
     std::string takeComplaints();
 
 private:
@@ -50,7 +49,7 @@ private:
     Descriptor _complaints;
 };
 
-/// The child's side: runs the service that the arguments after kChildServiceCommand ask for.
+/// The child's side: runs the service described by the arguments after kChildServiceCommand.
 int runChildService(int argc, char** argv);
 
 } // namespace pallax

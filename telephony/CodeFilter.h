@@ -11,16 +11,16 @@ namespace pallax {
 
 class Dictionary;
 
-/// The log codes that a start command asks for.
+/// The log codes that a start command requests.
 class CodeFilter {
 public:
-    /// Nothing when the command does not start the stream ("SetState" is not "Streaming"). The
-    /// lists "SetZorellLogCodes" (effective codes) and "SetHxExtraCodes" (bare codes of extended
-    /// records) name what is wanted; a technology without log codes (`everything`) gets all.
+    /// Nothing if the command does not start the stream ("SetState" is not "Streaming"). The lists
+    /// "SetZorellLogCodes" (effective codes) and "SetHxExtraCodes" (bare codes of extended records)
+    /// name the codes; a technology without log codes (`everything`) gets all packets.
     static std::optional<CodeFilter> fromStartCommand(const Dictionary& command, bool everything);
 
-    /// True also for a packet that is too short to have a code: what arrives broken is passed on
-    /// as it is, for the receiver to judge.
+    /// Also true for a packet that is too short to have a code: broken packets are passed on
+    /// unchanged for the receiver to judge.
     bool wants(Bytes packet) const;
 
 private:
@@ -28,7 +28,7 @@ private:
     std::unordered_set<LogCode> _codes; // effective
 };
 
-/// The effective log code of a packet, transport prefix or not; nothing when it is too short.
+/// The effective log code of a packet with or without transport prefix; nothing if it is too short.
 std::optional<LogCode> effectiveCodeOf(Bytes packet);
 
 } // namespace pallax

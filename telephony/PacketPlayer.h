@@ -22,21 +22,21 @@ struct PlayOptions {
     static constexpr double kAsFastAsTaken = std::numeric_limits<double>::infinity();
 
     double speed = 1.0; ///< positive; 2 plays in half the time
-    bool loop = false;  ///< begins again at the end, with ever later source times
-    /// The receiver's display ticks, which a last clock frame is to reach.
+    bool loop = false;  ///< restarts at the end, with source times that keep increasing
+    /// The receiver's tick interval; a last clock frame reaches the next tick.
     std::chrono::nanoseconds displayInterval = std::chrono::seconds(2);
-    /// The source is a live stream, whose stamps set neither the pace nor the receiver's ticks.
+    /// The source is a live stream: its stamps set neither the pace nor the receiver's ticks.
     bool live = false;
 };
 
-/// Plays a source into a sink with the source's own timing. The player drops nothing: one chunk is
-/// under way at a time, so a sink that waits for its receiver slows the player.
+/// Plays a source into a sink at the pace of the stamps. The player drops nothing: it sends one
+/// chunk at a time, so a sink that waits for its receiver slows the player down.
 ///
-/// Every packet goes with its source time. The first packet's time goes ahead of all, even when
-/// that packet is not wanted; while nothing is due, the running time goes at least every half
-/// second; after the last packet comes the time of the next display tick, then End. Where the
-/// stamps step back, playing goes on at once from there. Odd stamps are remarked on, ahead of their
-/// packets, wanted or not.
+/// Every packet carries its source time. The first packet's time is sent before everything else,
+/// even if that packet is not wanted. While no packet is due, the current time is sent at least
+/// every half second. After the last packet come the time of the next display tick and End. When
+/// the stamps step back, playing continues at once. A remark about an odd stamp precedes its
+/// packet, wanted or not.
 class PacketPlayer {
 public:
     using SteadyNow = std::function<std::chrono::steady_clock::time_point()>;
@@ -53,10 +53,10 @@ public:
         SteadyNow steadyNow = std::chrono::steady_clock::now;
     };
 
-    /// What the setup refers to outlives the player.
+    /// The references in the setup must outlive the player.
     explicit PacketPlayer(Setup setup);
 
-    /// Starts, or, while it plays, takes the new filter for what comes.
+    /// Starts, or changes the filter for the following packets.
     void play(CodeFilter filter);
 
 private:
@@ -80,15 +80,15 @@ private:
 
     Setup _setup;
     std::optional<CodeFilter> _filter;
-    std::optional<PacketSource::Packet> _packet; // fetched, not yet sent; its time is shifted
-    std::uint32_t _packetNumber = 0;             // of that packet in the source, from 1
+    std::optional<PacketSource::Packet> _packet; // read, not yet sent; its time is shifted
+    std::uint32_t _packetNumber = 0;             // its number in the source, from 1
     StampSequence _stamps;                       // of the packets, shifted
-    std::chrono::nanoseconds _shift{0};          // of this round's stamps
+    std::chrono::nanoseconds _shift{0};          // of the stamps in this round
     bool _newRound = true;
     bool _toldOutOfRange = false;
     bool _sourceEnded = false;
-    std::chrono::steady_clock::time_point _started; // the present stretch of stamps
-    std::shared_ptr<PacketPlayer*> _alive;          // blocks hold it weakly
+    std::chrono::steady_clock::time_point _started; // the current stretch of stamps
+    std::shared_ptr<PacketPlayer*> _alive;          // held weakly by blocks
 };
 
 } // namespace pallax

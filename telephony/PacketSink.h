@@ -7,17 +7,17 @@
 
 namespace pallax {
 
-/// Where a player's frames go: the receiving end of a log channel.
+/// The receiver of a player's frames: the end of a log channel.
 class PacketSink {
 public:
     virtual ~PacketSink() = default;
-    /// Appends a frame to the present chunk.
+    /// Appends a frame to the current chunk.
     virtual void write(const FrameHeader& header, Bytes data) = 0;
-    /// Bytes in the present chunk.
+    /// The size of the current chunk in bytes.
     virtual std::size_t pending() const = 0;
-    /// Sends the chunk and calls `done`, as a block of the main queue: as late as the receiver
-    /// makes it, or at once where the sink keeps what the receiver has no time for. Nothing is
-    /// written meanwhile. After the receiver has gone `done` need not be called.
+    /// Sends the chunk and calls `done` as a block of the main queue: once the receiver has taken
+    /// it, or at once if the sink buffers for a slow receiver. No write may happen in between. If
+    /// the receiver has gone, `done` may not be called.
     virtual void flush(std::function<void()> done) = 0;
 };
 

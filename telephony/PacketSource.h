@@ -12,8 +12,8 @@
 
 namespace pallax {
 
-/// Where the packets of a log channel come from: a recording, a stream, a simulated modem.
-/// Everything happens on the main queue.
+/// The source of a log channel's packets: a recording, a stream, a simulated modem. Used only on
+/// the main queue.
 class PacketSource {
 public:
     struct Packet {
@@ -24,7 +24,7 @@ public:
     };
     enum class State {
         Packet, ///< `packet` is set
-        Later,  ///< nothing yet: `whenReady` will tell
+        Later,  ///< nothing yet: use `whenReady`
         End
     };
     struct Next {
@@ -33,18 +33,18 @@ public:
     };
 
     virtual ~PacketSource() = default;
-    /// What GetTechnology is answered with.
+    /// The answer to GetTechnology.
     virtual std::string technology() const = 0;
     virtual Next next() = 0;
-    /// After Later: calls `ready` once, as a block of the main queue, when `next` has more to say.
+    /// After Later: calls `ready` once, as a block of the main queue, when `next` has a new result.
     virtual void whenReady(std::function<void()> ready) = 0;
-    /// Begins again with the first packet; false when the source cannot.
+    /// Restarts with the first packet; false if the source cannot.
     virtual bool restart() = 0;
-    /// After End: why the source ended before its time, as one sentence; empty when it did not.
+    /// After End: why the source ended early, as one sentence, or empty.
     virtual std::string failure() const = 0;
 };
 
-/// Makes the source of one more log channel.
+/// Creates the source for another log channel.
 using PacketSourceFactory = std::function<Result<std::unique_ptr<PacketSource>, HostError>()>;
 
 } // namespace pallax

@@ -8,7 +8,7 @@ namespace pallax {
 /// The packets of a recording in a file.
 class RecordingSource final : public PacketSource {
 public:
-    /// Fails for what cannot be opened, and for a link type that is no technology's.
+    /// Fails if the recording cannot be opened or has an unknown link type.
     static Result<std::unique_ptr<PacketSource>, HostError> open(const std::string& path);
 
     explicit RecordingSource(std::string path, std::unique_ptr<Recording> recording)
@@ -25,7 +25,7 @@ private:
     std::unique_ptr<Recording> _recording;
 };
 
-/// Opens a recording and makes sure of its technology.
+/// Opens a recording and checks its technology.
 Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const Recording::Input& input);
 
 } // namespace pallax

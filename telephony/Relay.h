@@ -16,37 +16,37 @@ class MainQueue;
 class RepeatingTimer;
 class TimerScheduler;
 
-/// Hands a live stream on to any number of log channels: each packet goes, when it comes, to the
-/// sources that have begun. At first the stream waits for its first source, for a while. From then
-/// on it is taken whether anybody listens or not, so that the stream's writer never waits. A stall,
-/// the end and a stream that breaks off are told apart.
+/// Distributes a live stream to any number of log channels: each packet goes at once to all started
+/// sources. The stream first waits for its first source, for a limited time. From then on it is
+/// read even without sources, so its writer never waits. Stalls, a regular end and a truncated or
+/// corrupt stream are reported separately.
 class Relay {
 public:
     using SteadyNow = std::function<std::chrono::steady_clock::time_point()>;
 
-    /// A stream that gives nothing for so long has stalled.
+    /// A stream that is silent for this long has stalled.
     static constexpr std::chrono::seconds kStall{10};
 
     struct Setup {
         MainQueue& queue;
         TimerScheduler& timers;
         std::unique_ptr<PacketSource> stream;
-        /// Hears, as one sentence, how the stream fares.
+        /// Receives a sentence for each change of the stream's state.
         std::function<void(const std::string& sentence)> report;
-        /// Called once after the stream's end; `isOrderly` when that lay between two packets.
+        /// Called once after the stream's end; `isOrderly` if it was between two packets.
         std::function<void(bool isOrderly)> ended;
         SteadyNow steadyNow = std::chrono::steady_clock::now;
-        /// How long the stream waits for its first source to begin.
+        /// How long the stream waits for its first source to start.
         std::chrono::nanoseconds patience{0};
     };
 
-    /// What the setup refers to outlives the relay.
+    /// The references in the setup must outlive the relay.
     explicit Relay(Setup setup);
     ~Relay();
     Relay(const Relay&) = delete;
     Relay& operator=(const Relay&) = delete;
 
-    /// A source of what comes from its first `next` on. It may outlive the relay, and ends then.
+    /// A source of the packets from its first `next` on. It may outlive the relay, which ends it.
     std::unique_ptr<PacketSource> source();
 
 private:
@@ -58,9 +58,9 @@ private:
     void handOn(const PacketSource::Packet& packet);
     void finish();
     void look();
-    /// A block that does it while the relay lives.
+    /// A block that calls the member unless the relay has been destroyed.
     std::function<void()> guarded(void (Relay::*member)());
-    /// The feeds whose sources live.
+    /// The feeds of the living sources.
     std::vector<std::shared_ptr<Feed>> feeds();
 
     Setup _setup;
@@ -72,7 +72,7 @@ private:
     bool _stalled = false;
     bool _ended = false;
     std::unique_ptr<RepeatingTimer> _looks;
-    std::shared_ptr<Relay*> _alive; // blocks hold it weakly
+    std::shared_ptr<Relay*> _alive; // held weakly by blocks
 };
 
 } // namespace pallax

@@ -15,7 +15,7 @@ class LocalMessagePort;
 class SocketMessagePorts;
 
 /// One log channel of the service: answers GetTechnology on its port, and streams to its client
-/// from the start command on. It lasts until the client ends the connection that it feeds.
+/// after the start command. It lasts until the client closes the connection that it feeds.
 class ServedChannel {
 public:
     struct Setup {
@@ -27,25 +27,25 @@ public:
         PlayOptions options;
         /// See SocketSink.
         std::optional<std::size_t> mostWaiting;
-        /// Hears, as one sentence, what becomes of a client that is slow.
+        /// Receives a sentence when a client becomes slow or recovers.
         std::function<void(const std::string& sentence)> report;
         /// The client has gone; may destroy the channel.
         std::function<void()> closed;
-        /// The source has come to its end, with its failure or an empty text.
+        /// The source has ended, with its failure or an empty text.
         std::function<void(const std::string& failure)> ended;
     };
 
-    /// Zero, or the errno that says why there is no channel (then `channel` stays empty).
+    /// Zero, or the errno of the failure (then `channel` stays empty).
     static int open(Setup setup, std::unique_ptr<ServedChannel>& channel);
     ~ServedChannel();
     ServedChannel(const ServedChannel&) = delete;
     ServedChannel& operator=(const ServedChannel&) = delete;
 
     ServiceStatus::Client status() const;
-    /// Whether the start command has come.
+    /// Whether the start command has arrived.
     bool hasStarted() const { return _hasStarted; }
     const std::string& receiverPortName() const { return _receiverPortName; }
-    /// Bytes that were sent, and that the client has not read yet.
+    /// Bytes sent that the client has not read yet.
     std::size_t untaken() const { return _sink->untaken(); }
 
 private:

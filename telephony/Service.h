@@ -12,37 +12,36 @@
 
 namespace pallax {
 
-/// What the telephony service is to serve.
+/// The options of a telephony service.
 struct ServiceOptions {
     static constexpr std::chrono::seconds kRelayPatience{10};
 
     /// Path, "-" for standard input; a stream is played once, to the first channel.
     std::string recording;
-    std::string inputName = {}; ///< what sentences call standard input; empty: that
+    std::string inputName = {}; ///< the name of standard input in messages; empty: the default
     PlayOptions play;
     std::string controlPortName = std::string(kTelephonyControlPort);
-    /// The recording is a live stream: it goes on to every client as it comes, and the service
-    /// ends with it.
+    /// The recording is a live stream: every client gets it live, and the service ends with it.
     bool relay = false;
-    /// How long what is relayed waits for its first client.
+    /// How long a relayed stream waits for its first client.
     std::chrono::nanoseconds relayPatience = kRelayPatience;
-    /// Every client sets its own pace and loses nothing, whatever the speed.
+    /// Every client sets its own pace and loses nothing, at any speed.
     bool lossless = false;
     std::optional<SimulationOptions> simulation = {}; ///< instead of a recording
 };
 
-/// "1.5", "max": how options say a speed.
+/// "1.5", "max": a speed as in the options.
 std::string speedText(double speed);
-/// Nothing for what is no positive number and not "max".
+/// Nothing unless the text is a positive number or "max".
 std::optional<double> parseSpeed(const std::string& text);
 
-/// Runs the service until SIGINT or SIGTERM, or the orderly end of what it relays, then returns 0.
-/// A failure is one sentence on standard error and the result 1. `ready`, if any, is called once
-/// clients can connect.
+/// Runs the service until SIGINT or SIGTERM, or the regular end of the relayed stream, then returns
+/// 0. On failure, prints a sentence on standard error and returns 1. `ready`, if any, is called
+/// once clients can connect.
 int runService(const ServiceOptions& options, const std::function<void()>& ready = {});
 
-/// Prints what the running service says of itself. Without one, a sentence on standard error and
-/// the result 1.
+/// Prints the status of the running service. Without one, prints a sentence on standard error and
+/// returns 1.
 int printServiceStatus();
 
 } // namespace pallax

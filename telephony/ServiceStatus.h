@@ -13,7 +13,7 @@ namespace pallax {
 
 class SocketMessagePorts;
 
-/// What a running service says of itself:
+/// The status of a running service:
 ///
 ///   to the control port    {"GetStatus": "GetStatus"}
 ///   its answer             {"Technology": text, "Uptime": seconds, "Sent": packets,
@@ -29,7 +29,7 @@ struct ServiceStatus {
     };
     std::string technology;
     std::int64_t uptimeSeconds = 0;
-    std::int64_t sent = 0;    ///< to all clients, those included that have gone
+    std::int64_t sent = 0;    ///< to all clients, including those that have left
     std::int64_t dropped = 0; ///< likewise
     std::vector<Client> clients;
     friend bool operator==(const ServiceStatus&, const ServiceStatus&) = default;
@@ -38,14 +38,14 @@ struct ServiceStatus {
 Dictionary statusRequest();
 bool isStatusRequest(const Dictionary& message);
 Dictionary statusReply(const ServiceStatus& status);
-/// Nothing when the reply lacks any of it.
+/// Nothing if the reply lacks a value.
 std::optional<ServiceStatus> parseStatusReply(const Dictionary& reply);
 
-/// Asks the service behind that control port; the sentence that tells why not.
-/// A service that lives and does not answer costs two seconds at most.
+/// Asks the service at this control port, or says why it cannot. A service that does not answer
+/// takes two seconds at most.
 Result<ServiceStatus, HostError> askStatus(SocketMessagePorts& ports,
                                            const std::string& controlPortName);
-/// As lines for the user.
+/// The status as lines for the user.
 std::string statusText(const ServiceStatus& status);
 
 } // namespace pallax

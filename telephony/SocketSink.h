@@ -15,23 +15,23 @@ class SocketDirectory;
 
 /// The connection of a log channel to the local port that it feeds.
 ///
-/// Either the receiver sets the pace, and nothing is lost; or the sink takes what comes, up to a
-/// bound, whatever the receiver does: packets that find no room are dropped and counted. The end
-/// of the source always waits for the receiver.
+/// Either the receiver sets the pace and nothing is lost, or the sink buffers packets up to a
+/// limit; packets that do not fit are dropped and counted. The end of the source always waits for
+/// the receiver.
 class SocketSink final : public PacketSink {
 public:
     struct Setup {
         AsioMainQueue& queue;
-        /// Bytes that may wait for a receiver that is slow; nothing: the receiver sets the pace.
+        /// Bytes that may wait for a slow receiver; nothing: the receiver sets the pace.
         std::optional<std::size_t> mostWaiting;
         /// Called once, as a block, when the receiver ends the connection; it may destroy the sink.
         std::function<void()> closed;
-        /// Called when the first packet is dropped, with 0, and when the receiver has caught up
-        /// again, with the number of packets that were dropped meanwhile.
+        /// Called with 0 when the first packet is dropped, and with the number of dropped packets
+        /// when the receiver has caught up.
         std::function<void(std::uint64_t count)> lost;
     };
 
-    /// Null when nobody listens under that name.
+    /// Null if there is no listener with this name.
     static std::unique_ptr<SocketSink> connect(Setup setup, const SocketDirectory& directory,
                                                std::string_view portName);
 
@@ -39,9 +39,9 @@ public:
     std::size_t pending() const override { return _unflushed; }
     void flush(std::function<void()> done) override;
 
-    /// Bytes that the receiver has not read yet, wherever they wait.
+    /// All bytes that the receiver has not read yet.
     std::size_t untaken() const;
-    std::uint64_t sent() const { return _packets; }    ///< packets, those included that wait
+    std::uint64_t sent() const { return _packets; }    ///< packets, including waiting ones
     std::uint64_t dropped() const { return _dropped; } ///< packets
 
 private:
@@ -56,11 +56,11 @@ private:
 
     Setup _setup;
     Descriptor _socket;
-    DescriptorWatch _watch;     // after the socket that it watches
-    ByteBuffer _chunk;          // under way
-    std::size_t _chunkSent = 0; // bytes of it
+    DescriptorWatch _watch;     // declared after the socket that it watches
+    ByteBuffer _chunk;          // being sent
+    std::size_t _chunkSent = 0; // bytes of it sent so far
     bool _isSending = false;
-    ByteBuffer _next; // what comes behind it
+    ByteBuffer _next; // the frames after it
     std::size_t _unflushed = 0;
     bool _holdsEnd = false;
     std::uint64_t _packets = 0;
@@ -68,7 +68,7 @@ private:
     std::uint64_t _droppedBefore = 0; // before the receiver fell behind
     bool _isBehind = false;
     std::function<void()> _done;
-    std::shared_ptr<SocketSink*> _alive; // blocks hold it weakly
+    std::shared_ptr<SocketSink*> _alive; // held weakly by blocks
 };
 
 } // namespace pallax

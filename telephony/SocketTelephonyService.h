@@ -8,10 +8,10 @@
 
 namespace pallax {
 
-/// The telephony service as a client reaches it over message ports.
+/// The telephony service for clients, over message ports.
 class SocketTelephonyService final : public TelephonyService {
 public:
-    /// `ports` outlives the service.
+    /// `ports` must outlive the service.
     explicit SocketTelephonyService(
         MessagePorts& ports, std::string controlPortName = std::string(kTelephonyControlPort))
         : _ports(ports), _controlPortName(std::move(controlPortName)) {}

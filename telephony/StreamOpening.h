@@ -12,18 +12,18 @@
 
 namespace pallax {
 
-/// How a live stream is opened, which takes until its header has come.
+/// Opens a live stream, which takes until its header has arrived.
 struct StreamOpening {
     using Opened = Result<std::unique_ptr<Recording>, HostError>;
 
     std::function<Opened()> open;
-    /// Hears, as one sentence, that the header lets wait for itself (on another thread, for the
-    /// caller's waits), and that it has come after all.
+    /// Receives a sentence when the header is late (on another thread, because the caller is
+    /// blocked), and when it has arrived after all.
     std::function<void(const std::string& sentence)> report;
     std::chrono::milliseconds patience = Relay::kStall;
 };
 
-/// What `open` gives. It returns when that does; a stream that never begins is reported meanwhile.
+/// Returns the result of `open`, when it returns; reports a stream that does not start.
 StreamOpening::Opened openStream(const StreamOpening& opening);
 
 } // namespace pallax

@@ -7,15 +7,15 @@ namespace pallax {
 
 class MainQueue;
 
-/// The packets of a recording that arrives while it is read, standard input: a thread waits for
-/// them, so that the main queue does not. It is played once.
+/// The packets of a recording that is still being written to standard input. A thread waits for
+/// them, so the main queue does not. Can be played once.
 class StreamSource final : public PacketSource {
 public:
-    /// So many packets are read ahead; then the thread, and with it the writer, waits.
+    /// The number of packets read ahead; then the thread, and with it the writer, waits.
     static constexpr std::size_t kMostAhead = 256;
 
-    /// `queue` accepts blocks from other threads. It outlives the source; the thread may outlive
-    /// the source until the stream's next packet, and touches no queue then.
+    /// `queue` must accept blocks from other threads and outlive the source. The thread may outlive
+    /// the source until the stream's next packet, but then does not use the queue.
     StreamSource(MainQueue& queue, std::unique_ptr<Recording> recording);
     ~StreamSource() override;
     StreamSource(const StreamSource&) = delete;
@@ -32,7 +32,7 @@ private:
 
     std::string _technology;
     std::shared_ptr<Shared> _shared;
-    ByteBuffer _current; // the packet that `next` gave last
+    ByteBuffer _current; // the latest packet from `next`
 };
 
 } // namespace pallax

@@ -25,20 +25,20 @@ class ServedChannel;
 class SocketMessagePorts;
 class TimerScheduler;
 
-/// The stand-in telephony service: a control port on which clients ask for log channels, and the
-/// channels, each with a source and a port of its own. Its destruction ends them all.
+/// The stand-in telephony service: a control port on which clients request log channels, and the
+/// channels, each with its own source and port. Destruction ends all of them.
 class TelephonyServer {
 public:
     using SteadyNow = std::function<std::chrono::steady_clock::time_point()>;
 
-    /// The bytes that wait for a slow client where packets come in their own time.
+    /// The bytes that may wait for a slow client if packets are paced.
     static constexpr std::size_t kMostWaiting = std::size_t{1} << 20U;
 
-    /// At the same time. For a client that asks for one more, the oldest channel that was never
-    /// started is closed; where all were, the client is refused.
+    /// The maximum number of channels. For one more, the oldest channel that was never started is
+    /// closed; if all have started, the client is refused.
     static constexpr std::size_t kMostChannels = 64;
 
-    /// A channel that has not been started for so long is closed.
+    /// How long a channel may stay unstarted before it is closed.
     static constexpr std::chrono::seconds kMostIdle{10};
 
     struct Setup {
@@ -47,27 +47,26 @@ public:
         std::string controlPortName = std::string(kTelephonyControlPort);
         PacketSourceFactory makeSource;
         PlayOptions options;
-        /// Hears, as one sentence, what goes wrong with a source or a client once channels are
-        /// served.
+        /// Receives a sentence for each problem with a source or a client while serving.
         std::function<void(const std::string& sentence)> report;
-        /// What the sources are of, for the status.
+        /// The technology of the sources, for the status.
         std::string technology = {};
-        /// See SocketSink; nothing: no client loses anything, each at its own pace.
+        /// See SocketSink; nothing: clients set their own pace and lose nothing.
         std::optional<std::size_t> mostWaiting = std::nullopt;
         SteadyNow steadyNow = std::chrono::steady_clock::now;
         TimerScheduler* timers = nullptr; ///< null: the queue's
     };
 
-    /// Fails when the control port cannot be made, or a living service has that name.
+    /// Fails if the control port cannot be created, or a living service has this name.
     static Result<std::unique_ptr<TelephonyServer>, HostError> start(Setup setup);
     ~TelephonyServer();
     TelephonyServer(const TelephonyServer&) = delete;
     TelephonyServer& operator=(const TelephonyServer&) = delete;
 
-    /// Gives up the control port, so that another service may have it; the channels stay.
+    /// Releases the control port, so another service can take it; the channels stay.
     void stopListening() { _control.reset(); }
     std::size_t channelCount() const { return _channels.size(); }
-    /// Bytes that were sent, and that their clients have not read yet.
+    /// Bytes sent that their clients have not read yet.
     std::size_t untaken() const;
     ServiceStatus status() const;
 
@@ -84,7 +83,7 @@ private:
     LogChannel createLogChannel(const std::string& localPortName);
     void removeChannel(int number);
     void closeIdle();
-    /// False when there is no room for one more channel, and none can be made.
+    /// False if there are too many channels and none can be closed.
     bool makeRoom();
     void close(Channels::iterator idle);
     void report(const std::string& sentence) const;
@@ -94,7 +93,7 @@ private:
     Channels _channels;
     int _latestNumber = 0;
     std::chrono::steady_clock::time_point _started;
-    std::int64_t _sentBefore = 0;    // to clients that have gone
+    std::int64_t _sentBefore = 0;    // to clients that have left
     std::int64_t _droppedBefore = 0; // likewise
     std::unique_ptr<RepeatingTimer> _looks;
 };

@@ -7,12 +7,12 @@
 
 namespace pallax {
 
-/// What is odd about the stamp of a packet of a recording.
+/// Something odd about the stamp of a packet.
 struct StampRemark {
     enum class Kind {
-        StepBack = 1,  ///< it lies `size` before the latest stamp: a stretch of time ends
-        Gap = 2,       ///< it lies `size` after the latest stamp
-        OutOfRange = 3 ///< no Time can hold it, or nobody could show it; another one is taken
+        StepBack = 1,  ///< it is `size` before the latest stamp: a stretch of time ends
+        Gap = 2,       ///< it is `size` after the latest stamp
+        OutOfRange = 3 ///< it was outside kEarliestTime to kLatestTime and was replaced
     };
     Kind kind = Kind::StepBack;
     std::chrono::nanoseconds size{0}; ///< not negative; 0 for OutOfRange
@@ -20,20 +20,20 @@ struct StampRemark {
     friend bool operator==(const StampRemark&, const StampRemark&) = default;
 };
 
-/// The stamps of a recording, in the order of its packets. A stamp may lie a little before the
-/// latest one, as it does where several sources were merged. One that lies further back (a clock
-/// was set, two recordings were joined) ends a stretch of time and begins the next.
+/// The stamps of a recording, in the order of its packets. A stamp may be slightly before the
+/// latest one, as in merged recordings. One that is further back (a clock was set, recordings were
+/// joined) ends a stretch of time and begins the next.
 class StampSequence {
 public:
-    /// A stamp may lie that far back within a stretch.
+    /// How far back a stamp may be within a stretch.
     static constexpr std::chrono::seconds kMostJitter{2};
     /// A longer time without a packet is a gap.
     static constexpr std::chrono::seconds kMostPause{60};
 
-    /// How a packet of that stamp would step, if it came next. The first one does not step.
+    /// How the next packet would step with this stamp. The first one does not step.
     std::optional<StampRemark> stepTo(Time stamp) const;
     bool wouldStepBack(Time stamp) const;
-    /// The packet has come.
+    /// Adds the next packet's stamp.
     void take(Time stamp);
 
     bool isEmpty() const { return !_first; }

@@ -6,8 +6,8 @@
 
 namespace pallax {
 
-/// The CDMA modem: camps on 1x and on EV-DO at once. Its sessions are voice calls on 1x and data
-/// on EV-DO in turns.
+/// The CDMA modem: camps on 1x and EV-DO at once. Its sessions alternate between voice calls on 1x
+/// and data on EV-DO.
 class CdmaModem final : public Modem {
 public:
     static ScenarioPlan plan();
@@ -24,7 +24,7 @@ private:
     void countTraffic(const Scenario& scenario);
 
     ReportMix<kKindCount> _mix;
-    unsigned _sessions = 0; ///< that have begun
+    unsigned _sessions = 0; ///< started so far
     unsigned _pagingTurn = 0;
     cdma::ForwardPackets _forward{91200, 40211, 18630, 90142};
     cdma::ReversePackets _reverse{91200, 31877, 7714};

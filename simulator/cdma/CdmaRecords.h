@@ -6,8 +6,8 @@
 #include <cstdint>
 #include <span>
 
-/// The log records of the CDMA modem (1x and EV-DO), from the values that an engineer names to
-/// bytes. Each layout has an encoder of its own.
+/// Encoders for the log records of the CDMA modem (1x and EV-DO), one for each layout, from values
+/// in engineering units.
 namespace pallax::cdma {
 
 /// 0x1183: state, session, carrier and levels of EV-DO.
@@ -29,7 +29,7 @@ struct EvdoStatus {
 };
 void encode(const EvdoStatus& status, ByteBuffer& out);
 
-/// A pilot with its part of the received power.
+/// A pilot with its share of the received power.
 struct Pilot {
     unsigned pn;
     double part_db;
@@ -74,7 +74,7 @@ struct TrafficFrame {
 void encode(const TrafficFrame& frame, ByteBuffer& out);
 
 /// 0x1192 and 0x127E: packets sent over a link so far, by their size in bits; a sequence number
-/// is a second.
+/// lasts one second.
 struct ForwardPackets {
     std::uint32_t sequence;
     std::uint32_t of1024;
@@ -89,7 +89,7 @@ struct ReversePackets {
 };
 void encode(const ReversePackets& packets, ByteBuffer& out);
 
-/// 0x134F: the 1x system that serves.
+/// 0x134F: the serving 1x system.
 struct SystemIdentity {
     unsigned roaming; ///< indicator: 0 off
     unsigned systemId;

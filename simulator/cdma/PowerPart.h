@@ -6,7 +6,7 @@
 
 namespace pallax::cdma {
 
-/// A pilot's part of the received power, in 512ths.
+/// A pilot's share of the received power, in 512ths.
 inline unsigned rawPart(double part_db) {
     constexpr double kWhole = 512;
     return rawOf(kWhole * std::pow(10.0, part_db / 10), 0, 1, 16);

@@ -2,7 +2,7 @@
 
 #include "simulator/RecordWriter.h"
 
-/// What records of subpackets have in common.
+/// The common layout of log records with subpackets.
 ///
 ///   byte  width  record
 ///   14    8      number of subpackets

@@ -13,7 +13,7 @@ namespace pallax {
 
 enum class CellRole { Serving, Neighbour };
 
-/// One cell of the cell-monitor list: its technology, whether it serves, and numbers under the
+/// One cell of the cell-monitor list: its technology, whether it serves, and numbers by the
 /// service's keys.
 PropertyList
 cellMonitorEntry(std::string_view technology, CellRole role,

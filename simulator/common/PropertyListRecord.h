@@ -13,7 +13,7 @@ inline constexpr std::uint32_t kPdpContextsCode = 0xFF0002;
 
 enum class ListForm { Xml, Binary };
 
-/// The records that the telephony service injects: a property list behind the header.
+/// The log records that the telephony service injects: a property list after the header.
 void encodePropertyList(std::uint32_t logCode, const PropertyList& object, ListForm form,
                         ByteBuffer& out);
 

@@ -6,7 +6,7 @@
 
 namespace pallax {
 
-/// The GSM/UMTS modem: UMTS where it is heard, GSM behind the hills.
+/// The GSM/UMTS modem: UMTS where it can be heard, GSM behind the hills.
 class GsmModem final : public Modem {
 public:
     enum Layer : std::size_t { kUmts, kGsm, kLayerCount };

@@ -6,8 +6,8 @@
 #include <cstdint>
 #include <span>
 
-/// The log records of the GSM/UMTS modem that are about GSM and GPRS, from the values that an
-/// engineer names to bytes. Each layout has an encoder of its own.
+/// Encoders for the GSM and GPRS log records of the GSM/UMTS modem, one for each layout, from
+/// values in engineering units.
 namespace pallax::gsm {
 
 /// 0x5134: identity of the serving cell.
@@ -18,7 +18,7 @@ struct ServingIdentity {
 };
 void encode(const ServingIdentity& identity, ByteBuffer& out);
 
-/// 0x5137: levels of the serving cell and its neighbours. Levels are told without their sign.
+/// 0x5137: levels of the serving cell and its neighbours. Levels have no sign.
 struct NeighbourLevel {
     unsigned arfcn;
     int level_dbm;
@@ -26,7 +26,7 @@ struct NeighbourLevel {
 };
 struct CellMeasurement {
     int level_dbm;
-    std::int32_t c1; ///< read as a quality, too
+    std::int32_t c1; ///< also read as a quality
     std::int32_t c2;
     bool hysteresisApplied;
     std::span<const NeighbourLevel> neighbours;
@@ -43,7 +43,7 @@ struct BsicList {
 };
 void encode(const BsicList& list, ByteBuffer& out);
 
-/// 0x5076: the ARFCN of the dedicated channel, of which the low byte is shown.
+/// 0x5076: the ARFCN of the dedicated channel, of which only the low byte is shown.
 struct DedicatedChannel {
     unsigned arfcn;
 };
@@ -74,14 +74,14 @@ struct Dtx {
 };
 void encode(const Dtx& dtx, ByteBuffer& out);
 
-/// 0x51F8: the frequencies between which the dedicated channel hops.
+/// 0x51F8: the frequencies of the dedicated channel's hopping sequence.
 struct MobileAllocation {
     unsigned hoppingSequence;
     std::span<const unsigned> arfcns;
 };
 void encode(const MobileAllocation& allocation, ByteBuffer& out);
 
-/// 0x51F4: where the packet system information stands.
+/// 0x51F4: the position of the packet system information.
 struct Si13Position {
     bool extended;
 };

@@ -2,7 +2,7 @@
 
 #include "simulator/Modem.h"
 
-/// What the GSM/UMTS modem measures of a scenario, and what it tells of its links.
+/// The GSM/UMTS modem's measurements of a scenario, and reports of its links.
 namespace pallax::gsm {
 
 /// The strongest UMTS cells; none behind a hill.
@@ -17,7 +17,7 @@ void reportHsdpa(const Scenario& scenario, Random& random, ByteBuffer& out);
 void reportMeasurement(const Scenario& scenario, Random& random, ByteBuffer& out);
 void reportBsics(const Scenario& scenario, ByteBuffer& out);
 
-/// A level's part of the carrier, in dB.
+/// A level relative to the carrier's, in dB.
 double ecno_db(const Scenario& scenario, double level_dbm);
 
 } // namespace pallax::gsm

@@ -5,8 +5,8 @@
 #include <cstdint>
 #include <span>
 
-/// The log records of the GSM/UMTS modem that are about the network: registration, mobility
-/// states, identities. Each layout has an encoder of its own.
+/// Encoders for the GSM/UMTS modem's log records about the network (registration, mobility states,
+/// identities), one for each layout.
 namespace pallax::gsm {
 
 /// 0x7132: the registration, in the record's numbering.
@@ -52,8 +52,8 @@ struct ServingPlmn {
 };
 void encode(const ServingPlmn& plmn, ByteBuffer& out);
 
-/// 0x7150: one network that counts as the same; entries overlap, so that a second one shared half
-/// of its digits with the first.
+/// 0x7150: one equivalent network; entries overlap, so a second one would share half of its digits
+/// with the first.
 struct EquivalentPlmn {
     unsigned country;
     unsigned network; ///< three digits

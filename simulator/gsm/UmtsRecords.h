@@ -5,15 +5,15 @@
 #include <cstdint>
 #include <span>
 
-/// The log records of the GSM/UMTS modem that are about UMTS, from the values that an engineer
-/// names to bytes. Each layout has an encoder of its own.
+/// Encoders for the UMTS log records of the GSM/UMTS modem, one for each layout, from values in
+/// engineering units.
 namespace pallax::gsm {
 
-/// 0x417A: the cells that the searcher sees. The level is the same for all: that of the carrier.
+/// 0x417A: the cells that the searcher sees. All share the carrier's level.
 struct SearchedCell {
     unsigned scramblingCode;
     bool active;
-    int ecno_db; ///< part of the carrier, -1 to -22: below, the energies have no even steps
+    int ecno_db; ///< share of the carrier, -1 to -22: lower energies have no even steps
 };
 struct Searcher {
     int carrier_dbm;
@@ -21,8 +21,8 @@ struct Searcher {
 };
 void encode(const Searcher& searcher, ByteBuffer& out);
 
-/// 0x4005: the ranking. The UMTS and the GSM list stand in the same place, so that only one of
-/// them can have entries.
+/// 0x4005: the ranking. The UMTS and the GSM list start at the same byte, so only one of them can
+/// have entries.
 struct RankedUmtsCell {
     unsigned uarfcn;
     unsigned scramblingCode;

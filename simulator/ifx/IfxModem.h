@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// The IFX modem, a GSM one, whose messages are no records: each is a property list with the
-/// whole picture, in one of two forms.
+/// The IFX modem, a GSM modem whose messages are not log records: each is a property list with the
+/// whole display, in one of two forms.
 class IfxModem final : public Modem {
 public:
     static ScenarioPlan plan();

@@ -7,7 +7,7 @@
 #include <optional>
 #include <span>
 
-/// The messages of the IFX modem, from the values that an engineer names to bytes.
+/// Encoders for the messages of the IFX modem, from values in engineering units.
 namespace pallax::ifx {
 
 /// Base station identity code: network and base station colour, each up to 7.
@@ -27,7 +27,7 @@ struct ServingCell {
 
 struct NeighbourCell {
     unsigned arfcn;
-    bool isRead; ///< else it is too weak, and its channel stands alone
+    bool isRead; ///< if not, it is too weak, and only its channel is written
     ColourCode bsic;
     int level_dbm;
 };
@@ -39,13 +39,13 @@ struct DedicatedChannel {
     unsigned timingAdvance;
     unsigned quality; ///< 0 to 7, best to worst
     int power_dbm;
-    std::span<const unsigned> hopping; ///< frequencies; none for a channel that stays on its own
+    std::span<const unsigned> hopping; ///< frequencies; empty without hopping
 };
 
-/// The radio resource control.
+/// State of the radio resource control.
 enum class RrState { Off, Selection, Establishment, Idle, Dedicated, Release };
 
-/// All that a message tells.
+/// The content of a message.
 struct Picture {
     static constexpr std::size_t kMostNeighbours = 6;
     static constexpr std::size_t kMostHopping = 7;

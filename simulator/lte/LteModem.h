@@ -8,8 +8,8 @@
 
 namespace pallax {
 
-/// The LTE modem: measurements of the serving carrier in idle and in connected mode, and in idle
-/// mode candidates on other carriers and of other technologies.
+/// The LTE modem: measurements of the serving carrier in idle and connected mode, and in idle mode
+/// also candidates on other carriers and technologies.
 class LteModem final : public Modem {
 public:
     static ScenarioPlan plan();

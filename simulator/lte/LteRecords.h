@@ -5,8 +5,8 @@
 #include <cstdint>
 #include <span>
 
-/// The log records of the LTE modem, from the values that an engineer names to bytes. Each layout
-/// has an encoder of its own. What a field cannot hold is taken to the nearest value that it can.
+/// Encoders for the log records of the LTE modem, one for each layout, from values in engineering
+/// units. A value that its field cannot hold is replaced by the nearest possible one.
 namespace pallax::lte {
 
 /// 0xB0C2: identity, frequencies and bandwidths of the serving cell.
@@ -85,8 +85,8 @@ struct ConnectedMeasurement {
 };
 void encode(const ConnectedMeasurement& measurement, ByteBuffer& out);
 
-/// 0xB186: the cell that the phone ranks as the best to reselect to; at most one, for entries
-/// overlap, so that a second one shared its numbers with the first.
+/// 0xB186: the best candidate for reselection; at most one, because entries overlap and a second
+/// one would share its numbers with the first.
 struct ReselectionCandidate {
     enum class Technology : unsigned { Lte = 0, Utran = 1, Geran = 2, Cdma1xRtt = 3, CdmaHrpd = 4 };
     Technology technology;

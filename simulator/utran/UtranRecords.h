@@ -6,8 +6,8 @@
 #include <cstdint>
 #include <span>
 
-/// The log records of the UTRAN modem, from the values that an engineer names to bytes. Each
-/// layout has an encoder of its own.
+/// Encoders for the log records of the UTRAN modem, one for each layout, from values in engineering
+/// units.
 namespace pallax::utran {
 
 /// 0xD0E0: the state of the radio resource control, in the record's numbering.
@@ -25,7 +25,7 @@ struct ServingCell {
 };
 void encode(const ServingCell& cell, ByteBuffer& out);
 
-/// 0xD00A: the cells around, the serving one among them; up to 127.
+/// 0xD00A: the surrounding cells, including the serving one; up to 127.
 enum class Set : unsigned { Active, Monitored, Detected };
 struct MeasuredCell {
     unsigned uarfcn;        ///< up to 16383
@@ -38,7 +38,7 @@ void encode(std::span<const MeasuredCell> cells, ByteBuffer& out);
 
 /// 0xD00E: the GSM neighbours.
 struct GsmNeighbour {
-    unsigned number; ///< in the list of the network, up to 16383
+    unsigned number; ///< its number in the network's list, up to 16383
     unsigned bandIndicator;
     bool bsicValid;
     unsigned ncc;
