@@ -15,7 +15,7 @@ namespace {
 
 constexpr char kQuote = '\'';
 
-/// The field that a pattern letter stands for; nothing for any other character.
+/// The field of a pattern letter; nothing for any other character.
 std::optional<std::int64_t> fieldOf(char letter, std::chrono::local_seconds local) {
     const auto day = std::chrono::floor<std::chrono::days>(local);
     const std::chrono::year_month_day date(day);

@@ -15,7 +15,7 @@ constexpr std::string_view kShowGSMRSSI = "PLShowGSMRSSI";
 
 void setGSMRSSI(Preferences& preferences, bool shown) {
     preferences.setValue(kShowGSMRSSI, PropertyList::boolean(shown), kHomeScreenDomain);
-    (void)preferences.synchronize(kHomeScreenDomain); // a failure at exit changes nothing
+    (void)preferences.synchronize(kHomeScreenDomain); // a failure at exit does not matter
     preferences.postChangedNotice(kHomeScreenDomain, kShowGSMRSSI);
 }
 

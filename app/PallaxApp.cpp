@@ -13,12 +13,12 @@ namespace pallax {
 namespace {
 
 constexpr const char* kNotConnected = "Connecting...";
-/// The root pane's first status, without dots, unlike every later one.
+/// The root pane's first status; without dots, unlike all later ones.
 constexpr const char* kLaunching = "Connecting";
 constexpr const char* kUpdatePattern = "'Updated' yyyy-MM-dd 'at' HH:mm:ss";
 constexpr const char* kRootPath = "/";
 
-/// The screens of the stack are panes, all of them made here or by another pane.
+/// All screens of the stack are panes, created here or by another pane.
 PallaxPaneController& paneOf(ui::TableScreen& screen) {
     return dynamic_cast<PallaxPaneController&>(screen);
 }
@@ -61,7 +61,7 @@ void PallaxApp::applicationDidFinishLaunching() {
     postRestart();
 }
 
-/// Connecting waits until the first screen is drawn.
+/// The connection starts after the first screen is drawn.
 void PallaxApp::postRestart() {
     if (!_isRestartPosted) {
         _isRestartPosted = true;
@@ -80,7 +80,7 @@ void PallaxApp::startAfresh() {
     if (!_model) {
         return;
     }
-    _model.reset(); // the name of its port is free for the next one's
+    _model.reset(); // frees the port's name for the next model
     _model = _surroundings.makeModel(*this);
     _displayAge = {};
     _technology.clear();
@@ -174,7 +174,8 @@ void PallaxApp::generatorChosen(const std::string& technology, bool keepsDisplay
     _technology = technology;
     _displayAge.generatorChosen(keepsDisplay, _surroundings.clock.now());
     if (keepsDisplay && _surroundings.startsAfreshByItself) {
-        _surroundings.queue.async(whileAlive(&PallaxApp::startAfresh)); // the model still works
+        _surroundings.queue.async(whileAlive(&PallaxApp::startAfresh)); // the model is still
+                                                                        // running
     } else {
         reportLink();
     }
@@ -194,7 +195,8 @@ NodeRef PallaxApp::nodeOf(const PallaxPaneController& pane, std::size_t index) {
 }
 
 void PallaxApp::reloadPanes() {
-    const auto panes = _navController->screens(); // a copy: popping changes the stack's own
+    const auto panes = _navController->screens(); // a copy, because popping changes the stack's own
+                                                  // list
     for (std::size_t index = 0; index < panes.size(); ++index) {
         PallaxPaneController& pane = paneOf(*panes[index]);
         NodeRef node = nodeOf(pane, index);

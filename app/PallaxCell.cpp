@@ -11,12 +11,12 @@ namespace {
 constexpr double kTextSize = 15;
 constexpr ui::Font kKeyFont{ui::FontFace::BoldSystem, kTextSize};
 constexpr ui::Font kValueFont{ui::FontFace::System, kTextSize};
-/// Both texts are measured with it; the slight over-width of the value is intended.
+/// The font for measuring both texts; the slight excess width of the value is intended.
 constexpr ui::Font kMeasuringFont = kKeyFont;
 
 constexpr double kMargin = 10;     ///< left of the key
-constexpr double kGap = 50;        ///< least room between key and value
-constexpr double kViewHeight = 50; ///< of the scroll container, whatever the row's height is
+constexpr double kGap = 50;        ///< minimum space between key and value
+constexpr double kViewHeight = 50; ///< of the scroll container, for any row height
 constexpr double kHalf = 0.5;
 
 std::shared_ptr<ui::Label> leftAlignedLabel(const ui::Font& font) {
@@ -60,7 +60,7 @@ void PallaxCell::placeKey(const ui::Size& extent) {
         return;
     }
     const ui::Rect& bounds = contentBounds();
-    // The bounds' y is not added, neither here nor for the value.
+    // The bounds' y is ignored, here and for the value.
     _key->frame = {{bounds.origin.x + kMargin, centred(extent.height, bounds.size.height)}, extent};
 }
 
@@ -79,13 +79,13 @@ void PallaxCell::setLayout() {
 
     const double need = key.width + kMargin + kGap + value.width;
     if (_value) {
-        // Flush right ignores the bounds' x.
+        // The flush-right position ignores the bounds' x.
         const double x =
             need < width ? width - value.width : bounds.origin.x + kMargin + key.width + kGap;
         _value->frame = {{x, centred(value.height, bounds.size.height)}, value};
     }
     if (_view) {
-        // A row that is needed to the last point has its value behind the key, but nothing to
+        // If the row is needed to the last point, the value follows the key but there is nothing to
         // scroll: "less than" above, "greater than" here.
         const double extra = need > width ? key.width + value.width : 0;
         _view->contentSize = {width + extra, kViewHeight};

@@ -30,7 +30,7 @@ void setText(const std::shared_ptr<ui::Label>& label, std::string text) {
     }
 }
 
-/// The cell that the table has to spare, whatever kind it was made as.
+/// A free cell of the table, of either kind.
 std::shared_ptr<PallaxCell> reusableCell(ui::TableView& table) {
     return std::dynamic_pointer_cast<PallaxCell>(table.dequeueReusableCell(kPaneCellIdentifier));
 }

@@ -16,12 +16,12 @@ namespace pallax {
 
 namespace {
 
-/// `Impl` and the timers agree on this one spelling of a delay.
+/// The one conversion of delays for `Impl` and the timers.
 std::chrono::steady_clock::duration steadyDuration(std::chrono::nanoseconds time) {
     return std::chrono::duration_cast<std::chrono::steady_clock::duration>(time);
 }
 
-/// What a repeating timer and the handler that waits for it share.
+/// The state shared by a repeating timer and its waiting handler.
 struct TimerState : std::enable_shared_from_this<TimerState> {
     TimerState(asio::io_context& context, std::chrono::nanoseconds period,
                std::function<void()> what)
@@ -153,7 +153,7 @@ DescriptorWatch::~DescriptorWatch() {
 
 namespace {
 
-/// A handler that forgets `action` once the watch is gone.
+/// A handler that drops `action` once the watch is destroyed.
 template <class State>
 auto onceAlive(std::weak_ptr<State> state, std::function<void()> action) {
     return [state = std::move(state), action = std::move(action)](const asio::error_code& error) {

@@ -9,7 +9,7 @@ namespace pallax {
 
 namespace {
 
-/// The status tells of the failure too, whether or not anybody reads why.
+/// Errors are ignored: the exit status reports the failure too.
 void writeToStandardError(const std::string& text) {
     (void)std::fwrite(text.data(), 1, text.size(), stderr);
 }

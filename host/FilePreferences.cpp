@@ -12,7 +12,7 @@ namespace pallax {
 
 namespace {
 
-/// What the file holds; an empty dictionary when there is none, nothing when it is unreadable.
+/// The file's values: an empty dictionary if it does not exist, nothing if it is unreadable.
 std::optional<Dictionary> valuesIn(const std::string& path) {
     std::error_code error;
     if (!std::filesystem::exists(path, error) && !error) {

@@ -75,7 +75,7 @@ bool writePrivateFile(const std::string& path, std::string_view content) {
     }
     const bool isWritten = writeAll(file, content);
     if (!isWritten) {
-        (void)::unlink(path.c_str()); // a part of it would be taken for the whole
+        (void)::unlink(path.c_str()); // a part must not be mistaken for the whole
     }
     return isWritten;
 }

@@ -15,11 +15,11 @@ namespace {
 using Handler = void (*)(int);
 
 constexpr std::array kEnding{SIGINT, SIGTERM, SIGHUP, SIGQUIT};
-/// How often blocked calls are interrupted: a few in a row, lines to a stalled standard error, are
-/// still over soon.
+/// How often blocked calls are interrupted; short enough that several in a row, such as lines to a
+/// stalled standard error, end soon.
 constexpr std::chrono::milliseconds kInterval{10};
 
-/// A signal handler can reach nothing but what is global.
+/// A signal handler can only access globals.
 struct State {
     volatile std::sig_atomic_t signal = 0;
     volatile std::sig_atomic_t ticks = 0;
@@ -27,8 +27,8 @@ struct State {
     timer_t timer{};
     timespec untilDue{};
     timespec interval{};
-    std::sig_atomic_t mostTicks = 0;                // of a program that SIGQUIT is to end
-    std::array<Handler, kEnding.size()> handlers{}; // that the signals had before, or null
+    std::sig_atomic_t mostTicks = 0;                // for a program that SIGQUIT must end
+    std::array<Handler, kEnding.size()> handlers{}; // the signals' previous handlers, or null
     Interruption::Terminal terminal{};
     struct sigaction alarmBefore {};
 };
@@ -39,7 +39,7 @@ timespec timeOf(std::chrono::milliseconds time) {
     return {seconds.count(), std::chrono::nanoseconds(time - seconds).count()};
 }
 
-/// The signal's place among the ending ones, or their number.
+/// The signal's index among the ending ones, or their number.
 std::size_t placeOf(int signal) {
     const auto* found = std::find(kEnding.begin(), kEnding.end(), signal);
     return static_cast<std::size_t>(found - kEnding.begin());
@@ -48,7 +48,7 @@ std::size_t placeOf(int signal) {
 } // namespace
 
 extern "C" {
-/// These call only what is safe in a signal handler.
+/// These call only functions that are safe in a signal handler.
 static void endIsAsked(int signal) {
     const int error = errno;
     if (state.signal == 0) {
@@ -64,9 +64,9 @@ static void endIsAsked(int signal) {
 
 static void interrupt(int signal) {
     const int error = errno;
-    if (state.signal == 0) { // somebody else's: it does what it did before
+    if (state.signal == 0) { // not ours: do what it did before
         (void)::sigaction(SIGALRM, &state.alarmBefore, nullptr);
-        (void)std::raise(signal); // takes effect behind this handler
+        (void)std::raise(signal); // takes effect after this handler
         return;
     }
     state.ticks = state.ticks + 1;
@@ -78,7 +78,7 @@ static void interrupt(int signal) {
             state.terminal.restore();
         }
         (void)std::signal(SIGQUIT, SIG_DFL);
-        (void)std::raise(SIGQUIT); // takes effect behind this handler
+        (void)std::raise(SIGQUIT); // takes effect after this handler
     }
     errno = error;
 }
@@ -94,7 +94,7 @@ Interruption::Interruption(Terminal terminal, Patience patience) {
     state.mostTicks =
         static_cast<std::sig_atomic_t>((patience.untilDeath - patience.untilDue) / kInterval);
     struct sigaction action {};
-    action.sa_handler = interrupt; // without SA_RESTART: interrupting is what it is for
+    action.sa_handler = interrupt; // without SA_RESTART, to interrupt calls
     (void)::sigfillset(&action.sa_mask);
     (void)::sigaction(SIGALRM, &action, &state.alarmBefore);
     sigset_t alarm;
@@ -108,7 +108,7 @@ Interruption::~Interruption() {
     if (state.isActive) {
         (void)::timer_delete(state.timer);
     }
-    (void)std::signal(SIGALRM, SIG_IGN); // one that is under way
+    (void)std::signal(SIGALRM, SIG_IGN); // one that is pending
     (void)::sigaction(SIGALRM, &state.alarmBefore, nullptr);
     state.isActive = false;
     state.ticks = 0;
@@ -128,7 +128,7 @@ void Interruption::watch(int signal) {
     state.handlers.at(place) = present.sa_handler;
     struct sigaction action {};
     action.sa_handler = endIsAsked;
-    action.sa_flags = static_cast<int>(SA_RESTART); // nothing is given up yet
+    action.sa_flags = static_cast<int>(SA_RESTART); // calls do not give up yet
     (void)::sigfillset(&action.sa_mask);
     (void)::sigaction(signal, &action, nullptr);
 }

@@ -12,7 +12,7 @@ namespace pallax {
 
 namespace {
 
-/// A failure stays with the stream.
+/// Failures are kept in the stream's state.
 void writeTo(std::FILE* file, std::string_view lines) {
     (void)std::fwrite(lines.data(), 1, lines.size(), file);
 }

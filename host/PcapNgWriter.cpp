@@ -10,12 +10,13 @@
 #include <sys/file.h>
 #include <sys/stat.h>
 
-// A block of a pcapng file is its type, its whole length, its body, which is padded to a multiple
-// of 4 bytes, and its length again. The bodies, offsets in bytes:
+// A block of a pcapng file is its type, its total length, its body, padded to a multiple of 4
+// bytes, and its length again. The bodies, offsets in bytes:
 //
 //   section header     0 byte-order magic, 4 version, 8 length of the section (unknown), options
 //   interface          0 link type (16 bits), 4 largest packet, options
-//   enhanced packet    0 interface, 4 stamp (high half first), 12 length here, 16 as it was, data
+//   enhanced packet    0 interface, 4 stamp (high half first), 12 captured length,
+//                      16 original length, data
 //
 // An option is its number and its length (16 bits each) and its value, padded to 4 bytes.
 
@@ -32,7 +33,7 @@ constexpr std::uint16_t kInterfaceName = 2;
 constexpr std::uint16_t kSectionProgram = 4;
 constexpr std::uint16_t kStampResolution = 9;
 
-constexpr char kNanoseconds = 9; // the stamps count units of 10 to the power of -9 s
+constexpr char kNanoseconds = 9; // the unit of stamps is 10 to the power of -9 s
 constexpr std::size_t kAlignment = 4;
 constexpr std::size_t kBlockFrame = 12; // type and both lengths
 constexpr std::size_t kPacketHead = 20; // of an enhanced packet's body, before the data
@@ -41,7 +42,7 @@ std::size_t padded(std::size_t length) {
     return (length + kAlignment - 1) / kAlignment * kAlignment;
 }
 
-/// Puts a block together.
+/// Builds a block.
 class Block {
 public:
     Block(std::uint32_t type, std::size_t bodySize) {
@@ -123,7 +124,7 @@ Result<std::unique_ptr<PcapNgWriter>, HostError> PcapNgWriter::create(const std:
     return writer;
 }
 
-/// What there is nothing to lose of is begun at once, which also shows that it can be written.
+/// A file without content to lose is started at once, which also shows that it is writable.
 std::optional<HostError> PcapNgWriter::open(bool isNew) {
     struct stat status {};
     _isFile = _file && ::fstat(_number, &status) == 0 && S_ISREG(status.st_mode);
@@ -186,7 +187,7 @@ std::optional<HostError> PcapNgWriter::write(Time time, Bytes packet) {
     return error;
 }
 
-/// The size of the file to which the path leads, if that is the one that is written.
+/// The size of the file at the path, if it is the file being written.
 std::optional<std::uint64_t> PcapNgWriter::sizeInPlace() const {
     struct stat there {};
     const bool isThere = ::stat(_name.c_str(), &there) == 0 && identityOf(there) == _identity;
@@ -219,7 +220,7 @@ std::optional<HostError> PcapNgWriter::put(const ByteBuffer& block) {
         }
         if (count <= 0) {
             const int error = count < 0 ? errno : ENOSPC;
-            if (_file) { // standard output's reader has the rest already
+            if (_file) { // the reader of standard output already has the rest
                 (void)!::ftruncate(_number, static_cast<off_t>(_size));
             }
             return unwritableRecording(_name, error);

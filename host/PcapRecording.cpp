@@ -26,8 +26,8 @@ RecordingError errorOf(Kind kind, const std::string& name, std::string_view what
     return {kind, formatText("%@ %@.", {name, what})};
 }
 
-/// How a file's stamps count seconds: pcap in 32 bits without a sign, which the library reads as
-/// signed; pcapng in 64 bits of its own units.
+/// How a file's stamps store seconds: pcap as unsigned 32 bits, which the library reads as signed;
+/// pcapng as 64 bits in its own units.
 enum class StampForm { Pcap, PcapNg };
 
 class PcapRecording final : public Recording {
@@ -77,12 +77,12 @@ struct Stamp {
     bool isOutOfRange;
 };
 
-/// A moment of any file, or the nearest one that a recording may have.
+/// A stamp of any file, limited to the range of recordings.
 Stamp stampOf(const timeval& stamp, StampForm form) {
     constexpr std::int64_t kMostNanoseconds = 999'999'999;
     const std::int64_t seconds =
         form == StampForm::Pcap ? static_cast<std::uint32_t>(stamp.tv_sec) : stamp.tv_sec;
-    // Opened for nanoseconds, which then stand in the field for microseconds.
+    // Opened for nanoseconds, which are then in the field for microseconds.
     const std::int64_t rest = std::clamp<std::int64_t>(stamp.tv_usec, 0, kMostNanoseconds);
     if (seconds < dateOf(kEarliestTime).time_since_epoch().count()) {
         return {kEarliestTime, true};
@@ -103,7 +103,7 @@ std::optional<RecordedPacket> PcapRecording::next() {
         return RecordedPacket{stamp.time, Bytes(data, header->caplen), stamp.isOutOfRange};
     }
     if (status == PCAP_ERROR) {
-        // A read that met the end of the file in the middle of something.
+        // A read reached the end of the file within a packet or header.
         const bool cut = std::feof(pcap_file(_capture)) != 0;
         _error = cut ? errorOf(Kind::CutShort, _name, "ends in the middle of a packet")
                      : errorOf(Kind::Unreadable, _name,
@@ -123,7 +123,7 @@ struct OpenedFile {
     bool isStream;
 };
 
-/// Opens the file for reading, or says why not.
+/// Opens the file for reading; the error says why it cannot.
 Result<OpenedFile, RecordingError> openFile(const Recording::Input& input,
                                             const std::string& name) {
     const auto failed = [&name](std::string_view reason) {

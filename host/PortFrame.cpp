@@ -133,7 +133,7 @@ std::size_t PortFrameParser::feedHeader(Bytes bytes) {
 std::size_t PortFrameParser::feedData(Bytes bytes) {
     ByteBuffer& data = _frame.data;
     const std::size_t taken = std::min(bytes.size(), _length - data.size());
-    // As the data comes, never by the claimed length alone.
+    // Grows with the received data, never by the claimed length alone.
     if (data.size() + taken > data.capacity()) {
         data.reserve(std::min(_length, std::max(data.size() + taken, 2 * data.size())));
     }

@@ -9,7 +9,7 @@ namespace pallax {
 
 namespace {
 
-// The link types are those that capture files reserve for private use, from USER0 on.
+// Link types reserved for private use, from USER0 on.
 constexpr std::array<RecordedTechnology, 5> kTechnologies = {{
     {147, kHXLogChannelTechnology_IFX, "ifx"},
     {148, kHXLogChannelTechnology_Zorell_GSM, "gsm"},

@@ -17,7 +17,7 @@ bool canBeReadAgain(const struct stat& status) {
     return S_ISREG(status.st_mode) || S_ISDIR(status.st_mode) || S_ISBLK(status.st_mode);
 }
 
-/// True once there is something to read, or the end; a wait below zero lasts until then.
+/// True once there is data to read, or the end; a negative wait is unlimited.
 bool waitForData(const Descriptor& file, std::chrono::milliseconds wait) {
     pollfd data{file.number(), POLLIN, 0};
     int count = 0;
@@ -37,7 +37,7 @@ bool RecordingFile::isStream(const std::string& path) {
 Result<RecordingFile, RecordingError> RecordingFile::open(const std::string& path,
                                                           const Recording::Waiting& waiting,
                                                           std::chrono::milliseconds patience) {
-    // A named pipe is to be waited for here, where that can be told, and not in the call.
+    // Wait for a named pipe here, where that can be reported, not in the call.
     Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY));
     struct stat status {};
     std::string_view reason;

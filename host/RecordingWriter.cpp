@@ -12,7 +12,7 @@ namespace pallax {
 
 namespace {
 
-/// Of numbers of 32 bits, low bytes first.
+/// The bytes of 32-bit numbers, little-endian.
 template <std::size_t kCount>
 void append(ByteBuffer& out, const std::array<std::uint32_t, kCount>& numbers) {
     constexpr unsigned kNumberBits = 32;
@@ -84,7 +84,7 @@ std::optional<HostError> RecordingWriter::write(Time time, Bytes packet) {
     if (seconds < 0 || seconds > std::numeric_limits<std::uint32_t>::max()) {
         return HostError{"A packet before 1970 or after 2106 cannot be recorded."};
     }
-    const auto length = static_cast<std::uint32_t>(packet.size()); // captured, and as it was
+    const auto length = static_cast<std::uint32_t>(packet.size()); // captured and original
     append<4>(_pending, {static_cast<std::uint32_t>(seconds),
                          static_cast<std::uint32_t>((time - second).count()), length, length});
     _pending.insert(_pending.end(), packet.begin(), packet.end());

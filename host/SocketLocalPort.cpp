@@ -18,12 +18,12 @@ namespace pallax {
 namespace {
 
 constexpr std::size_t kChunkSize = std::size_t{64} << 10U;
-/// Before the next try after descriptors or memory have run out.
+/// The delay before the next try after descriptors or memory have run out.
 constexpr std::chrono::milliseconds kAcceptRetryDelay{100};
 
 } // namespace
 
-/// What outlives the port while one of its blocks runs.
+/// The part that outlives the port while one of its blocks runs.
 struct SocketLocalPort::State : std::enable_shared_from_this<State> {
     /// Which file the path itself is, so that only our own is removed.
     static FileIdentity fileAt(const std::string& path) {
@@ -40,18 +40,18 @@ struct SocketLocalPort::State : std::enable_shared_from_this<State> {
     }
     void acceptAll();
     void remove(const Session* session);
-    /// Ends every connection and removes the socket's file, if it is still ours. Nobody takes the
-    /// name over meanwhile, for the listener lives until the state ends: no lock is needed.
+    /// Ends every connection and removes the socket's file if it is still ours. No lock is needed:
+    /// the listener lives until the state ends, so no one can take over the name.
     void close();
 
     Setup setup;
     FileIdentity identity;
     MainQueue* dispatch = nullptr;
     std::list<std::shared_ptr<Session>> sessions;
-    DescriptorWatch arrivals; // after the listener that it watches
+    DescriptorWatch arrivals; // declared after the listener that it watches
 };
 
-/// One connection to the port: reads a piece, delivers its frames one per block, reads on.
+/// One connection to the port: reads a chunk, delivers its frames one per block, reads the next.
 class SocketLocalPort::Session : public std::enable_shared_from_this<Session> {
 public:
     Session(const std::shared_ptr<State>& port, Descriptor socket)
@@ -72,13 +72,13 @@ private:
 
     std::weak_ptr<State> _port;
     Descriptor _socket;
-    DescriptorWatch _watch; // after the socket that it watches
+    DescriptorWatch _watch; // declared after the socket that it watches
     PortFrameParser _parser;
-    std::optional<PortFrame> _frame; // whole, not yet delivered
+    std::optional<PortFrame> _frame; // complete, not yet delivered
     std::array<std::uint8_t, kChunkSize> _chunk{};
-    Bytes _unread; // the part of _chunk that is still to be parsed
+    Bytes _unread; // the part of _chunk not yet parsed
     ByteBuffer _answer;
-    std::size_t _answered = 0; // bytes of _answer that are sent
+    std::size_t _answered = 0; // bytes of _answer already sent
     bool _tellsTime = false;
 };
 
@@ -139,7 +139,7 @@ void SocketLocalPort::Session::step() {
     handle(port);
 }
 
-/// False when there is nothing now, or nothing any more.
+/// False if there is no data now, or the connection has ended.
 bool SocketLocalPort::Session::readChunk(State& port) {
     const Transfer transfer = receiveFrom(_socket, _chunk);
     if (transfer.state == Transfer::State::WouldBlock) {
@@ -162,7 +162,7 @@ void SocketLocalPort::Session::handle(const std::shared_ptr<State>& port) {
             times->sourceBegan(_frame->header.isLive);
         }
         if (times->advance(*_frame->header.sourceTime)) {
-            stepLater(); // the frame waits behind what the ticks have posted
+            stepLater(); // the frame waits until the ticks' blocks have run
             return;
         }
     }
@@ -194,7 +194,7 @@ void SocketLocalPort::Session::handle(const std::shared_ptr<State>& port) {
     case FrameKind::NoReply:
         break;
     }
-    cutOff(); // nobody has asked
+    cutOff(); // there was no request
 }
 
 void SocketLocalPort::Session::tellRemark(SourceTimeListener* times, const PortFrame& frame) {
@@ -209,8 +209,8 @@ void SocketLocalPort::Session::tellRemark(SourceTimeListener* times, const PortF
     }
 }
 
-/// Touches nothing of the port after the callback but what it has kept alive: the callback may
-/// destroy the port, or throw.
+/// After the callback, touches only what it has kept alive: the callback may destroy the port, or
+/// throw.
 void SocketLocalPort::Session::deliver(const std::shared_ptr<State>& port, const PortFrame& frame) {
     const auto self = shared_from_this();
     const auto& receive = port->setup.receive;

@@ -14,14 +14,14 @@ namespace pallax {
 
 namespace {
 
-/// Removes a stale socket without the lock. Another process may have replaced it by a living one
-/// since it was found stale; that one is put back.
+/// Removes a stale socket without the lock. If another process has replaced it by a living one
+/// since the check, that one is put back.
 void moveAside(const std::string& path, const std::string& folder) {
     const std::string aside = folder + formatText("/stale.%d", {::getpid()});
     if (::rename(path.c_str(), aside.c_str()) != 0) {
         return;
     }
-    // Where the name has been taken meanwhile, it stays with whoever took it.
+    // If the name has been taken meanwhile, it stays with its new owner.
     [[maybe_unused]] const bool isBack =
         listenerAt(aside) == Listener::Living && ::link(aside.c_str(), path.c_str()) == 0;
     (void)::unlink(aside.c_str());

@@ -23,7 +23,7 @@ SteadyTime deadlineIn(std::chrono::nanoseconds timeout) {
 
 enum class Direction { Read, Both };
 
-/// Waits until bytes can move; false once the time is up, however busy the peer is.
+/// Waits until bytes can be moved; false after the deadline, even if the peer is busy.
 bool waitFor(const Descriptor& socket, Direction direction, SteadyTime deadline) {
     for (;;) {
         const auto left = std::chrono::ceil<std::chrono::milliseconds>(
@@ -63,18 +63,19 @@ struct SocketRemotePort::State : std::enable_shared_from_this<State> {
 
     AsioMainQueue& queue;
     Descriptor socket;
-    std::unique_ptr<DescriptorWatch> watch; // after the socket that it watches; null at the end
+    std::unique_ptr<DescriptorWatch> watch; // declared after the socket that it watches; null at
+                                            // the end
     SocketRemotePort* port = nullptr;
     InvalidationCallback invalidated;
     PortFrameParser parser;
     std::uint32_t requestNumber = 0;
-    std::optional<PortFrame> reply; // to the present request
-    /// The rest of a frame whose send timed out in the middle: it must go before the next.
+    std::optional<PortFrame> reply; // to the current request
+    /// The rest of a frame whose send timed out in the middle: it must precede the next.
     ByteBuffer unsent;
 };
 
-/// Takes what has arrived, or, of a peer that never stops, so much that others get their turn and
-/// a deadline is looked at; false when the connection has ended.
+/// Reads what has arrived. From a peer that never stops, reads only a limited amount, so that
+/// others get their turn and deadlines are checked. False if the connection has ended.
 bool SocketRemotePort::State::receive() {
     constexpr std::size_t kPieceSize = std::size_t{16} << 10U;
     constexpr int kMostChunks = 16;
@@ -99,7 +100,7 @@ bool SocketRemotePort::State::receive() {
     return true;
 }
 
-/// False for a frame that the peer must not send.
+/// False for a frame that the peer may not send.
 bool SocketRemotePort::State::takeFrame(PortFrame frame) {
     const FrameKind kind = frame.header.kind;
     if (kind != FrameKind::Reply && kind != FrameKind::NoReply) {
@@ -111,7 +112,7 @@ bool SocketRemotePort::State::takeFrame(PortFrame frame) {
     return true;
 }
 
-/// Always false, for the caller to return.
+/// Always false, as the caller's result.
 bool SocketRemotePort::State::peerEnded() {
     watch.reset();
     socket.reset();
@@ -126,7 +127,7 @@ bool SocketRemotePort::State::peerEnded() {
     return false;
 }
 
-/// One attempt at the rest of an earlier frame; false when the connection has ended.
+/// One attempt to send the rest of an earlier frame; false if the connection has ended.
 bool SocketRemotePort::State::sendRest() {
     const Transfer transfer = sendTo(socket, unsent);
     if (transfer.state == Transfer::State::Closed) {
@@ -140,7 +141,7 @@ SendError SocketRemotePort::State::send(Bytes header, Bytes data, SteadyTime dea
     const std::size_t size = header.size() + data.size();
     std::size_t sent = 0;
     while (sent < size) {
-        // Replies are taken meanwhile: a peer that is stuck in one would not read.
+        // Read replies in the meantime: a peer blocked on sending one would not read.
         if (!receive()) {
             return SendError::InvalidPort;
         }

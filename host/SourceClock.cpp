@@ -10,7 +10,7 @@ namespace pallax {
 
 namespace {
 
-/// The last tick follows the latest packet that there can be.
+/// The last tick comes after the latest possible packet.
 constexpr Time kLatestTick = kLatestTime + std::chrono::minutes(1);
 
 } // namespace
@@ -18,7 +18,7 @@ constexpr Time kLatestTick = kLatestTime + std::chrono::minutes(1);
 struct SourceClock::TimerState {
     std::chrono::nanoseconds interval;
     std::function<void()> action;
-    std::optional<Time> due; ///< nothing before a stretch of source times has begun
+    std::optional<Time> due; ///< empty until a stretch of source times has started
     bool alive = true;
     std::unique_ptr<RepeatingTimer> wallTimer;
 };
@@ -58,7 +58,7 @@ Clock::Zone SourceClock::zone(Time time) const {
     return _wallClock.zone(time);
 }
 
-/// For how long no source time has been heard, once one has.
+/// How long the source has been silent since its first source time.
 std::chrono::nanoseconds SourceClock::silence() const {
     return _steadyNow() - *_heard;
 }
@@ -84,7 +84,7 @@ std::unique_ptr<RepeatingTimer> SourceClock::scheduleRepeating(std::chrono::nano
     return std::make_unique<Timer>(std::move(state));
 }
 
-/// Of a timer that begins now.
+/// For a timer that starts now.
 std::optional<Time> SourceClock::nextTick(std::chrono::nanoseconds interval) const {
     if (_times.isEmpty() || _stretchEnds) {
         return std::nullopt;
@@ -120,11 +120,11 @@ bool SourceClock::advance(Time sourceTime) {
         beginStretch(time);
     }
     _times.take(time);
-    _now = std::max(*_now, time); // a recording's stamps may step back a little
+    _now = std::max(*_now, time); // a recording's stamps may step back slightly
     return false;
 }
 
-/// The timer that is due first, of those that are due by `latest`; null when none is.
+/// The earliest timer due by `latest`; null if there is none.
 std::shared_ptr<SourceClock::TimerState> SourceClock::earliestTimer(Time latest) const {
     std::shared_ptr<TimerState> earliest;
     if (_times.isEmpty()) {
@@ -155,7 +155,7 @@ void SourceClock::stampRemark(std::uint32_t packet, const StampRemark& remark) {
     }
 }
 
-/// A live source's service may go before the timers fire again: they do it now.
+/// A live source's service may exit before the timers fire again, so they fire now.
 void SourceClock::sourceEnded() {
     _hasEnded = true;
     if (_isLive) {

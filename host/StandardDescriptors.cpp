@@ -9,7 +9,7 @@ namespace pallax {
 bool openStandardDescriptors() {
     for (int number = STDIN_FILENO; number <= STDERR_FILENO; ++number) {
         const bool isClosed = ::fcntl(number, F_GETFD) < 0 && errno == EBADF;
-        // The lowest free number is given; for reading only, so that what is written fails.
+        // The system returns the lowest free number; opened for reading only, so that writes fail.
         if (isClosed && ::open("/dev/null", O_RDONLY) != number) { // NOLINT: children inherit it
             return false;
         }

@@ -24,8 +24,8 @@ constexpr std::size_t kLongestAddress = sizeof(sockaddr_un::sun_path) - 1;
 constexpr std::string_view kDescriptors = "/proc/self/fd/";
 constexpr std::size_t kMostDigits = std::numeric_limits<int>::digits10 + 1; // of a descriptor
 
-/// The address of a socket's path. A path that has no room in an address is reached through a
-/// descriptor of its folder.
+/// The address of a socket's path. A path that is too long for an address goes through a descriptor
+/// of its folder.
 class Address {
 public:
     explicit Address(const std::string& path) {
@@ -45,7 +45,7 @@ public:
         }
     }
 
-    /// False with errno set where no address leads to the path.
+    /// False with errno set if the path has no address.
     explicit operator bool() const { return _isWhole; }
     const sockaddr* generic() const {
         return static_cast<const sockaddr*>(static_cast<const void*>(&_address));
@@ -63,7 +63,7 @@ private:
         _isWhole = true;
     }
 
-    Descriptor _folder; // the address leads through it
+    Descriptor _folder; // used in the address
     sockaddr_un _address{};
     bool _isWhole = false;
 };
@@ -95,7 +95,7 @@ Listener listenerAt(const std::string& path) {
     if (!address || !probe) {
         return Listener::None;
     }
-    // EAGAIN: it listens, but its queue of connections is full.
+    // EAGAIN: it listens, but its backlog is full.
     if (::connect(probe.number(), address.generic(), Address::size()) == 0 || errno == EAGAIN) {
         return Listener::Living;
     }
@@ -148,7 +148,7 @@ Transfer receiveFrom(const Descriptor& socket, std::span<std::uint8_t> buffer) {
 }
 
 Transfer sendTo(const Descriptor& socket, Bytes first, Bytes second) {
-    // The kernel reads only; its structure has no const.
+    // The kernel only reads; its structure has no const.
     const auto part = [](Bytes bytes) {
         return iovec{const_cast<std::uint8_t*>(bytes.data()), bytes.size()};
     };

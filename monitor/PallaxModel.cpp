@@ -54,7 +54,7 @@ void PallaxModel::handOutFrame() {
 }
 
 NodeRef PallaxModel::topLevelNodes() {
-    if (_nodes || _nodesByPath) { // paths without a root: the display was asked for, and is null
+    if (_nodes || _nodesByPath) { // paths without a root: a display was requested and is null
         return _nodes;
     }
     if (_driver.generator() == nullptr) {

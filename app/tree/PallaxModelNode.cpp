@@ -23,7 +23,7 @@ public:
     HeldArrayLock& operator=(const HeldArrayLock&) = delete;
 };
 
-/// How many nodes the object's tree has at most.
+/// The maximum number of nodes in the object's tree.
 std::size_t nodesIn(const PropertyList& object) {
     std::size_t nodes = 1;
     if (const DictionaryRef dictionary = object.dictionary()) {
@@ -49,11 +49,11 @@ public:
     }
 
 private:
-    /// The leaves of one branch lie side by side and live as long as any of them is held. One
-    /// allocation for each leaf made a fifth of a tick of 50,000 (bench/ScreenBench).
+    /// The leaves of one branch are contiguous and live as long as any of them is in use. Separate
+    /// allocations took a fifth of a tick of 50,000 leaves (bench/ScreenBench).
     using Leaves = std::shared_ptr<std::deque<PallaxModelLeafNode>>;
 
-    /// The object is not null: where there is no value there is no row.
+    /// `object` must not be null: a null has no row.
     NodeRef node(SharedName name, const PropertyList& object, std::string path, Leaves& leaves) {
         NodeRef made = make(std::move(name), object, path, leaves);
         _paths.insert_or_assign(std::move(path), made);
@@ -95,12 +95,12 @@ private:
     }
 
     std::vector<NodeRef> childrenOf(const Array& array, const std::string& path) {
-        const HeldArrayLock lock; // records may be replacing the elements
+        const HeldArrayLock lock; // records may be replacing elements
         Leaves leaves;
         std::vector<NodeRef> children;
         children.reserve(array.size());
         for (const PropertyList& element : array) {
-            if (element.isNull()) { // where there is no value there is no row, and no number
+            if (element.isNull()) { // a null has no row and no number
                 continue;
             }
             auto name = std::make_shared<const std::string>(std::to_string(children.size()));
@@ -117,14 +117,14 @@ private:
 
 NodeRef PallaxModelNode::makeTreeFromObject(const PropertyList& object,
                                             PathDictionary& pathDictionary) {
-    // Growing step by step costs a tree of 50,000 leaves a sixth of its tick (bench/ScreenBench).
+    // Growing stepwise took a sixth of a tick of 50,000 leaves (bench/ScreenBench).
     pathDictionary.reserve(nodesIn(object));
     return TreeBuilder(pathDictionary).root(object);
 }
 
 void makeChildPath(std::string& path, std::string_view name) {
     const std::size_t nameStart = std::min(name.find_first_not_of('/'), name.size());
-    path.resize(path.find_last_not_of('/') + 1); // to nothing where there is none
+    path.resize(path.find_last_not_of('/') + 1); // clears it if there is none
     path += '/';
     path += name.substr(nameStart);
 }

@@ -10,7 +10,8 @@ namespace {
 constexpr std::string_view kSortedKey = "_sorted";
 constexpr char kSortSeparator = ';';
 
-/// What a sorted dictionary shows of a key: the second of exactly two pieces, else the whole.
+/// The name of a key in a sorted dictionary: the second of exactly two parts, otherwise the whole
+/// key.
 std::string_view nameOfSortedKey(std::string_view key) {
     const std::size_t separator = key.find(kSortSeparator);
     if (separator == std::string_view::npos ||

@@ -44,7 +44,7 @@ std::string buttonFace(std::string_view text, bool isNarrow) {
 
 int drawButton(Grid& grid, int right, int y, std::string_view face, bool hasFocus) {
     const int left = right - columnsOf(face);
-    // Bold and underlined too, so that the focus is seen where there are no colours.
+    // Bold and underlined too, so that the focus is visible without colours.
     grid.put(left, y, face, {.bold = hasFocus, .underline = hasFocus, .accent = hasFocus});
     return left;
 }

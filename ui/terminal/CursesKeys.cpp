@@ -35,7 +35,7 @@ struct Sequence {
     Key key;
 };
 
-/// What xterm, the console and rxvt send, and those that follow them.
+/// The sequences of xterm, the console, rxvt and terminals compatible with them.
 constexpr auto kSequences = std::to_array<Sequence>({
     {"", U'A', Key::Up},
     {"", U'B', Key::Down},
@@ -99,7 +99,7 @@ std::optional<KeyEvent> keyOfSequence(std::string_view parameters, char32_t fina
 
 KeyEvent keyOfCharacter(char32_t character) {
     constexpr char32_t kEscape = 0x1B;
-    constexpr char32_t kDelete = 0x7F; // what most terminals send for the backspace key
+    constexpr char32_t kDelete = 0x7F; // sent by most terminals for the backspace key
     switch (character) {
     case U'\r':
     case U'\n':

@@ -24,11 +24,11 @@ namespace {
 
 constexpr short kAccentPair = 1;
 
-/// Milliseconds in which an escape sequence is complete, also over a network that stutters.
+/// Milliseconds in which an escape sequence must be complete, even over a slow network.
 constexpr int kEscapeDelay = 100;
 
-/// Opened anew for the keys, even where it is standard input: whoever waits for the descriptor may
-/// make it non-blocking, which is to stay unseen by those who share standard input with us.
+/// Opened again for the keys, even if it is standard input: waiting on a descriptor may make it
+/// non-blocking, which must not affect other users of standard input.
 constexpr const char* kControllingTerminal = "/dev/tty";
 
 struct FileCloser {
@@ -36,8 +36,8 @@ struct FileCloser {
 };
 using OwnedFile = std::unique_ptr<std::FILE, FileCloser>;
 
-/// What leaves the screen as it was: attributes off, cursor seen, keypad and mouse off, the other
-/// screen back.
+/// The sequence that restores the screen: attributes off, cursor visible, keypad and mouse off,
+/// normal screen.
 std::string restoringSequence() {
     constexpr std::string_view kMouseOff = "\x1b[?1000l\x1b[?1002l\x1b[?1003l\x1b[?1006l";
     std::string sequence =
@@ -48,8 +48,8 @@ std::string restoringSequence() {
     return sequence + terminalCapability("rmcup") + "\r\n";
 }
 
-/// Ctrl-Z waits while this lives. The library ignores it while it draws, so that it would be lost;
-/// held back, it takes effect behind the drawing.
+/// Delays Ctrl-Z while it lives. The library ignores Ctrl-Z while it draws, so it would be lost;
+/// instead it takes effect after the drawing.
 class HeldSuspension {
 public:
     HeldSuspension() {
@@ -70,13 +70,13 @@ bool isUtf8Locale() {
     return std::string_view(::nl_langinfo(CODESET)) == "UTF-8";
 }
 
-/// Nothing is said about characters beyond ASCII.
+/// Whether the locale says nothing about characters beyond ASCII.
 bool isPlainLocale() {
     return std::string_view(::nl_langinfo(CODESET)) == "ANSI_X3.4-1968";
 }
 
-/// What follows an escape character that the library has taken for one of its own: the rest of a
-/// control sequence that it does not know, or nothing.
+/// The key after an escape character that the library has read on its own: the rest of a control
+/// sequence that it does not know, or nothing.
 std::optional<KeyEvent> keyAfterEscape() {
     constexpr char32_t kFirstFinal = 0x40;
     constexpr char32_t kEscape = 0x1B;
@@ -85,7 +85,7 @@ std::optional<KeyEvent> keyAfterEscape() {
         return KeyEvent{.key = Key::Escape};
     }
     if (code != U'[' && code != U'O') {
-        ::unget_wch(static_cast<wchar_t>(code)); // a key pressed right behind the other
+        ::unget_wch(static_cast<wchar_t>(code)); // a key pressed right after the other
         return keyOfCharacter(kEscape);
     }
     std::string parameters;
@@ -103,7 +103,7 @@ bool wantsColor(ColorUse use) {
            (use == ColorUse::Auto && (refusal == nullptr || *refusal == '\0'));
 }
 
-/// A cell's text as the library takes it: a character and a few combining ones.
+/// A cell's text in the library's form: a character and a few combining ones.
 std::array<wchar_t, CCHARW_MAX + 1> wideText(std::string_view text, bool asciiOnly) {
     std::array<wchar_t, CCHARW_MAX + 1> wide{};
     std::size_t count = 0;
@@ -154,11 +154,11 @@ bool CursesTerminal::isPossible() {
 
 Result<std::unique_ptr<CursesTerminal>, TerminalError>
 CursesTerminal::open(const Options& options) {
-    (void)std::setlocale(LC_CTYPE, ""); // numbers stay as the C locale writes them
+    (void)std::setlocale(LC_CTYPE, ""); // numbers keep the C locale's form
     auto impl = std::make_unique<Impl>();
     impl->isUtf8 = isUtf8Locale();
     if (isPlainLocale()) {
-        // What is typed is most likely UTF-8 all the same; what is shown stays ASCII.
+        // Typed text is most likely still UTF-8; the screen stays ASCII.
         (void)std::setlocale(LC_CTYPE, "C.UTF-8");
     }
     impl->input.reset(std::fopen(kControllingTerminal, "re"));
@@ -188,7 +188,7 @@ CursesTerminal::open(const Options& options) {
     }
     if (options.mouse) {
         ::mousemask(BUTTON1_PRESSED | BUTTON4_PRESSED | BUTTON5_PRESSED, nullptr);
-        ::mouseinterval(0); // a press counts at once
+        ::mouseinterval(0); // report a press at once
     }
     return std::unique_ptr<CursesTerminal>(new CursesTerminal(std::move(impl)));
 }

@@ -10,14 +10,14 @@ namespace pallax::terminal {
 
 namespace {
 
-constexpr int kScrollColumns = 8; // at a key, of a row that does not fit
+constexpr int kScrollColumns = 8; // per key, in a row that does not fit
 
 } // namespace
 
 FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
     : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }) {}
 
-/// What a click would do may be gone by now, until the next drawing tells.
+/// Click areas may be out of date until the next drawing.
 void FrontEnd::needsDisplay() {
     _hits.clear();
     _surroundings.needsDisplay();
@@ -103,13 +103,13 @@ void FrontEnd::handle(const KeyEvent& event) {
     }
     if (_message) {
         _message.reset();
-        _surroundings.needsDisplay(); // what a click would do is still the same
+        _surroundings.needsDisplay(); // the click areas do not change
     }
     endFilterOfOtherPane();
-    // A copy, for the screen may be closed by what it does.
+    // A copy, because the action may close the screen.
     const std::shared_ptr<ui::ModalScreen> modal = navigation->modal();
     if (!modal) {
-        _modalFocus = ModalFocus::Save; // of the next one to be opened
+        _modalFocus = ModalFocus::Save; // for the next one to be opened
     }
     if (_toolkit.alert() != nullptr) {
         handleAlert(event);
@@ -139,7 +139,7 @@ void FrontEnd::handleMouse(const KeyEvent& event) {
         }
         return;
     }
-    // A copy, for the action may change what is on the screen.
+    // A copy, because the action may change the screen.
     if (const HitMap::Action action = _hits.at(event.x, event.y)) {
         action();
     }
@@ -158,7 +158,7 @@ void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
     TerminalTextField& field = terminalTextField(screen.field());
     if (event.key == Key::Escape) {
         if (field.isEditing() && !field.text().empty()) {
-            field.resignFirstResponder(); // what was typed is not lost by one key
+            field.resignFirstResponder(); // so one key does not discard the typed text
         } else {
             screen.cancelPressed();
         }
@@ -176,7 +176,7 @@ void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
             _modalFocus = forwards ? ModalFocus::Save : ModalFocus::Cancel;
             field.resignFirstResponder();
         } else if (field.handle(event) && !field.isEditing()) {
-            _modalFocus = ModalFocus::Save; // behind the return key
+            _modalFocus = ModalFocus::Save; // after the return key
         }
         return;
     }
@@ -329,7 +329,7 @@ void FrontEnd::save() {
              "save-button-marker, a path that exists.",
              "Close"});
     }
-    const auto action = button->action; // a copy, for the items may be replaced
+    const auto action = button->action; // a copy, because the items may be replaced
     action();
 }
 

@@ -51,7 +51,7 @@ void Grid::set(int x, int y, std::string text, Style style) {
     _cells[index(x, y)] = {std::move(text), style};
 }
 
-/// A half of a wide character that is overwritten leaves its other half blank.
+/// Overwriting one half of a wide character blanks its other half.
 void Grid::separateWideCharacterAt(int x, int y) {
     if (_cells[index(x, y)].text.empty() && x > 0) {
         _cells[index(x - 1, y)].text.assign(1, ' ');

@@ -9,8 +9,8 @@ namespace pallax::terminal {
 
 namespace {
 
-/// By how many of `lines` lines a key scrolls a page that shows `rows` of them; nothing for a key
-/// that does not scroll.
+/// How many lines a key scrolls a page of `lines` lines that shows `rows` of them; nothing for any
+/// other key.
 std::optional<int> scrolledLines(const KeyEvent& event, int rows, int lines) {
     constexpr int kWheelLines = 3;
     switch (event.key) {
@@ -35,7 +35,7 @@ std::optional<int> scrolledLines(const KeyEvent& event, int rows, int lines) {
     }
 }
 
-/// The letters that stand for keys.
+/// Replaces the letters that act as keys.
 KeyEvent withoutLetters(const KeyEvent& event) {
     if (event.key != Key::Character) {
         return event;
@@ -61,7 +61,7 @@ void HelpPage::open() {
     _first = 0;
 }
 
-/// The line at which the page begins when it is scrolled to its end.
+/// The first visible line when the page is scrolled to its end.
 int HelpPage::lastFirst() const {
     return std::max(_lines - _rows, 0);
 }
@@ -75,7 +75,7 @@ void HelpPage::handle(const KeyEvent& event) {
 void HelpPage::draw(Grid& grid, const Marks& marks) {
     _rows = drawHelp(grid, marks, _first);
     _lines = static_cast<int>(helpLines(grid.columns()).size());
-    _first = std::min(_first, lastFirst()); // there may be more room than before
+    _first = std::min(_first, lastFirst()); // the box may have grown
 }
 
 } // namespace pallax::terminal

@@ -74,7 +74,7 @@ bool LineEditor::handleControl(char32_t character) {
 }
 
 bool LineEditor::insert(char32_t character) {
-    constexpr char32_t kDelete = 0x7F; // with it begin the control characters behind ASCII
+    constexpr char32_t kDelete = 0x7F; // the first control character after ASCII
     constexpr char32_t kNoBreakSpace = 0xA0;
     if ((character >= kDelete && character < kNoBreakSpace) || character > kLastCodePoint ||
         isSurrogate(character)) {
@@ -107,7 +107,7 @@ std::size_t LineEditor::after() const {
     return clusters.empty() ? _cursor : _cursor + clusters.front().bytes;
 }
 
-/// What is typed before a combining character that stood on its own takes it along.
+/// A lone combining character joins the character typed before it.
 std::size_t LineEditor::boundaryFrom(std::size_t offset) const {
     for (const Cluster& cluster : clustersOf(_text)) {
         const std::size_t end = cluster.offset + cluster.bytes;

@@ -14,10 +14,10 @@ namespace {
 constexpr std::string_view kTitle = "Save snapshot";
 constexpr std::string_view kFieldName = "Description";
 constexpr int kWidth = 76;
-/// Where less than this is inside the frame, names and buttons are shortened.
+/// With fewer columns inside the frame, names and buttons are shortened.
 constexpr int kNarrow = 28;
 constexpr int kFieldAndButtons = 2;
-constexpr int kBlankRows = 2; // above and below the field, where there is room
+constexpr int kBlankRows = 2; // above and below the field, if there is room
 
 } // namespace
 
@@ -26,7 +26,7 @@ void ModalView::draw(ui::ModalScreen& screen, ModalFocus focus) {
     const Box box =
         centeredBox(_grid, kWidth, listRows + Box::kFrame + kFieldAndButtons + kBlankRows);
     drawBox(_grid, _marks, box, kTitle);
-    _hits.clear(); // nothing under a modal screen can be touched
+    _hits.clear(); // a modal screen covers all click areas
     _hits.add(0, 0, _grid.columns(), _grid.rows(), [&screen] { screen.backgroundTouched(); });
     const int inner = box.rows - Box::kFrame;
     const int shown = std::clamp(inner - kFieldAndButtons, 0, listRows);

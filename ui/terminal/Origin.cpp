@@ -8,10 +8,10 @@ namespace pallax::terminal {
 
 namespace {
 
-/// The end of the text, behind a mark, in at most so many columns; empty where that says too
-/// little.
+/// The end of the text, after a mark, in at most `columns` columns; empty if too short to be
+/// useful.
 std::string endOf(std::string_view text, const Marks& marks, int columns) {
-    constexpr int kLeastColumns = 6; // of which the mark is one
+    constexpr int kLeastColumns = 6; // including the mark
     if (columns < kLeastColumns) {
         return "";
     }

@@ -15,7 +15,7 @@ namespace {
 constexpr int kFrameColumns = 4; // frame and blanks
 constexpr int kKeyColumns = 18;  // of the help page
 
-/// The text in lines of at most so many columns, broken at blanks; a longer word is cut.
+/// Wraps the text at blanks into lines of at most this width; cuts longer words.
 std::vector<std::string> wrapped(std::string_view text, int columns) {
     std::vector<std::string> lines(1);
     while (!text.empty()) {

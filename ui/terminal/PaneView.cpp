@@ -31,7 +31,7 @@ const ui::Label* labelOf(const ui::BarItems& items) {
     return nullptr;
 }
 
-/// The titles from one on joined, behind a mark where some are left out.
+/// The titles from `first` on, joined, after a mark if some are omitted.
 std::string breadcrumbs(const TerminalNavigation& navigation, const Marks& marks,
                         std::size_t first) {
     const auto& screens = navigation.screens();
@@ -43,7 +43,7 @@ std::string breadcrumbs(const TerminalNavigation& navigation, const Marks& marks
     return path;
 }
 
-/// How many titles must be left out, the first ones first; never the last one.
+/// How many titles must be omitted, starting with the first; never the last one.
 std::size_t leftOutCrumbs(const TerminalNavigation& navigation, const Marks& marks, int columns) {
     const std::size_t last = navigation.screens().size() - 1;
     std::size_t first = 0;
@@ -59,7 +59,7 @@ struct Range {
     std::size_t end = 0;
 };
 
-/// A range of `text` widened to whole characters, each with the combining ones that follow it.
+/// A range of `text` widened to whole characters with the combining characters after them.
 Range wholeCharacters(std::string_view text, Range range) {
     Range whole = range;
     for (const Cluster& cluster : clustersOf(text)) {
@@ -117,7 +117,7 @@ void PaneView::drawTitle(TerminalNavigation& navigation, TerminalTable& table,
         _grid.put(right, kTitleRow, count, kDim);
         right -= 1;
     }
-    // The way here goes before, whole.
+    // The full path has priority.
     const int path = columnsOf(breadcrumbs(navigation, _marks, 0));
     const std::string beside = originText(origin, _marks, right - kMargin - path - kGap);
     if (!beside.empty()) {
@@ -127,7 +127,7 @@ void PaneView::drawTitle(TerminalNavigation& navigation, TerminalTable& table,
     drawBreadcrumbs(navigation, right);
 }
 
-/// A click on a title goes back to its pane; one on the mark, to the last of those left out.
+/// A click on a title goes back to its pane; a click on the mark, to the last omitted pane.
 void PaneView::drawBreadcrumbs(TerminalNavigation& navigation, int right) {
     const Span room{kMargin, right};
     const auto& screens = navigation.screens();
@@ -150,8 +150,8 @@ void PaneView::drawBreadcrumbs(TerminalNavigation& navigation, int right) {
     }
 }
 
-/// Tells of rows outside the window, at the end of the rule; where that begins is returned. A click
-/// does what the key does.
+/// Shows the number of rows outside the window at the end of the rule; returns its first column. A
+/// click acts like the key.
 int PaneView::drawHiddenRows(int y, std::string_view mark, std::size_t rows, Key key,
                              const PaneStatus& status) {
     if (rows == 0) {
@@ -166,7 +166,7 @@ int PaneView::drawHiddenRows(int y, std::string_view mark, std::size_t rows, Key
     return left;
 }
 
-/// Where the values are old, the line says so.
+/// Also says that the values are old, if they are.
 void PaneView::drawUpperRule(const TerminalTable& table, const PaneStatus& status) {
     constexpr int kRow = kFirstTableRow - 1;
     _grid.fill({kMargin, _grid.columns() - kMargin}, kRow, _marks.horizontal, kDim);
@@ -180,7 +180,7 @@ void PaneView::drawUpperRule(const TerminalTable& table, const PaneStatus& statu
               [press = status.press] { press({.key = Key::Character, .character = U'R'}); });
 }
 
-/// Returns where what tells of hidden rows begins.
+/// Returns the first column of the number of hidden rows.
 int PaneView::drawLowerRule(const TerminalTable& table, std::size_t windowRows,
                             const PaneStatus& status) {
     const int row = _grid.rows() - kRowsBelowTable;
@@ -219,7 +219,7 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const P
                         bool isSelected) {
     const ui::CellContents contents = cell.contents();
     const std::string count = row.elements ? std::to_string(*row.elements) : "";
-    // A count stands at the end of the room for texts, behind a blank.
+    // A count is at the end of the text area, after a blank.
     const int width =
         columnOf(cell.contentBounds().size.width) - (count.empty() ? 0 : columnsOf(count) + 1);
     int offset = 0;
@@ -273,7 +273,7 @@ void PaneView::drawToolbar(const TerminalNavigation& navigation, const TerminalT
     drawHints(items, table, end, status);
 }
 
-/// A text that does not fit loses its beginning: times and file names stand at the end.
+/// A text that does not fit is cut at its beginning, because times and file names are at its end.
 int PaneView::drawCutInFront(int x, int y, std::string_view text) {
     const int right = _grid.columns() - kMargin;
     const int beyond = x + columnsOf(text) - right;
@@ -318,7 +318,7 @@ void PaneView::drawHint(int left, std::string_view text, const KeyEvent& key,
     _hits.add(left, y, end - left, 1, [press = status.press, key] { press(key); });
 }
 
-/// The keys that matter here, as many as fit behind the status; a click does what the key does.
+/// The most useful keys, as many as fit after the status; a click acts like the key.
 void PaneView::drawHints(const ui::BarItems& items, const TerminalTable& table, int from,
                          const PaneStatus& status) {
     const auto character = [](char32_t key) {
@@ -351,7 +351,7 @@ void PaneView::drawHints(const ui::BarItems& items, const TerminalTable& table, 
 
 void PaneView::drawFilterPrompt(const LineEditor& editor, const PaneStatus& status) {
     const int y = _grid.rows() - 1;
-    const int start = kMargin + 2; // behind "/ "
+    const int start = kMargin + 2; // after "/ "
     const int cursor = columnsOf(std::string_view(editor.text()).substr(0, editor.cursor()));
     const int last = _grid.columns() - 1 - kMargin;
     // A long text is scrolled so that the cursor stays visible.

@@ -34,7 +34,7 @@ void TerminalNavigation::presentModal(std::shared_ptr<ui::ModalScreen> screen, b
     _modal = std::move(screen);
     _modal->viewDidLoad();
     _modal->viewWillAppear(animated);
-    terminalTextField(_modal->field()).beginEditing(); // typing is what comes next
+    terminalTextField(_modal->field()).beginEditing(); // the user will type next
 }
 
 void TerminalNavigation::dismissModal(bool animated) {

@@ -13,11 +13,11 @@ namespace {
 
 constexpr std::array kDeadly{SIGSEGV, SIGBUS, SIGFPE, SIGILL, SIGABRT, SIGQUIT, SIGSYS, SIGTRAP};
 constexpr std::array kEnding{SIGINT, SIGTERM, SIGHUP, SIGQUIT};
-/// The handler runs on a stack of its own, for the other may be what has run out.
+/// The handler has its own stack, because the normal one may have overflowed.
 constexpr std::size_t kStackSize = std::size_t{32} << 10U;
 constexpr std::size_t kMaximumSequence = 256;
 
-/// A signal handler can reach nothing but what is global.
+/// A signal handler can only access globals.
 struct Restoration {
     int descriptor = -1;
     termios modes{};
@@ -31,7 +31,8 @@ Restoration restoration;
 } // namespace
 
 extern "C" {
-/// Calls only what is safe in a signal handler. The signal's own action is back by then.
+/// Calls only functions that are safe in a signal handler. The signal's default action has been
+/// restored.
 static void restoreAndDie(int signal) {
     TerminalRestorer::restore();
     (void)std::raise(signal);
@@ -57,8 +58,7 @@ void giveBack(const std::array<int, kCount>& signals) {
     }
 }
 
-/// As Ctrl-Q. What undoes a stop of the program's own does not undo the user's, unless that comes
-/// on top.
+/// Like Ctrl-Q. TCOON only undoes a stop by the program, not by the user, unless it follows TCOOFF.
 void goOn(int descriptor) {
     (void)::tcflow(descriptor, TCOOFF);
     (void)::tcflow(descriptor, TCOON);
@@ -74,7 +74,7 @@ void TerminalRestorer::release() {
 }
 
 void TerminalRestorer::restore() {
-    goOn(restoration.descriptor); // or a process that is to die would wait
+    goOn(restoration.descriptor); // otherwise a dying process would wait
     (void)!::write(restoration.descriptor, restoration.sequence.data(), restoration.size);
     if (restoration.hasModes) {
         (void)::tcsetattr(restoration.descriptor, TCSANOW, &restoration.modes);

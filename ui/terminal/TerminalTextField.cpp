@@ -18,7 +18,7 @@ void TerminalTextField::beginEditing() {
 
 bool TerminalTextField::handle(const KeyEvent& event) {
     if (event.key == Key::Enter) {
-        // The toolkit's own answer to the return key would be none.
+        // The toolkit has no default action for the return key.
         if (_delegate != nullptr) {
             (void)_delegate->textFieldShouldReturn(*this);
         }

@@ -9,7 +9,7 @@ namespace pallax::terminal {
 
 namespace {
 
-/// A screen has no state of its own on a terminal: whatever happens to it, it is drawn anew.
+/// A screen has no state on a terminal: every event just redraws it.
 class TerminalScreenView final : public ui::ScreenView {
 public:
     explicit TerminalScreenView(std::function<void()> needsDisplay)
@@ -30,7 +30,7 @@ private:
 
 } // namespace
 
-/// Makes its stack the one that the toolkit's screen shows.
+/// Its stack becomes the one that the toolkit shows.
 class TerminalWindow final : public ui::Window {
 public:
     explicit TerminalWindow(TerminalToolkit& toolkit) : _toolkit(toolkit) {}
@@ -80,7 +80,7 @@ std::unique_ptr<ui::TableView> TerminalToolkit::makeTableView(ui::TableSource& s
     return std::make_unique<TerminalTable>(source, rowContentBounds(_columns), _needsDisplay);
 }
 
-/// There is one layout, whatever its name: a list, the field, and the two buttons.
+/// There is one layout for every name: a list, the field, and the two buttons.
 ui::ModalOutlets TerminalToolkit::loadLayout(std::string_view /*name*/, ui::TableSource& source) {
     ui::ModalOutlets outlets;
     outlets.list = makeTableView(source);

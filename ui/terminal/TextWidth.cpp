@@ -13,7 +13,7 @@ namespace pallax::terminal {
 
 namespace {
 
-/// The calling thread's character type is UTF-8's for a scope, whatever the user's locale is.
+/// Sets the calling thread's character type to UTF-8 for a scope, in any locale.
 class Utf8CharacterType {
 public:
     Utf8CharacterType() : _previous(::uselocale(utf8())) {}
@@ -22,7 +22,7 @@ public:
     Utf8CharacterType& operator=(const Utf8CharacterType&) = delete;
 
 private:
-    /// The C library carries this locale in itself. Kept for the life of the process.
+    /// This locale is built into the C library. Kept until the process ends.
     static locale_t utf8() {
         static locale_t locale = ::newlocale(LC_CTYPE_MASK, "C.UTF-8", nullptr);
         return locale;
@@ -31,7 +31,7 @@ private:
     locale_t _previous;
 };
 
-/// Of what does not command the terminal; -1 for what cannot be shown.
+/// The width of a character that does not command the terminal; -1 for an unprintable one.
 int columnsOfCodePoint(char32_t codePoint) {
     constexpr char32_t kFirstBeyondAscii = 0x80;
     return codePoint < kFirstBeyondAscii ? 1 : ::wcwidth(static_cast<wchar_t>(codePoint));
@@ -42,7 +42,7 @@ bool isPlainAscii(std::string_view text) {
                        [](char byte) { return byte >= ' ' && byte < 0x7F; });
 }
 
-/// A cluster for each character of the escape, all of them standing for the same bytes.
+/// Adds a cluster for each character of the escape, all with the same source bytes.
 void addEscape(std::vector<Cluster>& clusters, char32_t codePoint, std::size_t at,
                std::size_t size) {
     std::string escape;
