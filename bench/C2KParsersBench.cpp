@@ -59,7 +59,7 @@ Record connectedStatus() {
     return Record(0x1183).padTo(50).at(36, 5);
 }
 
-/// A list of entries from byte `start` on whose bytes are all 1, so that no energy is 0.
+/// A list of entries from byte `start`; all their bytes are 1, so that no energy is 0.
 Record sixEntries(LogCode code, std::size_t countAt, std::size_t start, std::size_t entrySize) {
     Record record(code);
     record.padTo(start + 6 * entrySize).at(countAt, 6);

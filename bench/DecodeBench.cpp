@@ -1,9 +1,9 @@
-// How long a whole decode of a recording takes, beside a bare libpcap loop over the same file, in
-// one process. Usage: decode_bench RECORDING [ROUNDS]
+// The time of a whole decode of a recording, compared with a bare libpcap loop over the same file,
+// in one process. Usage: decode_bench RECORDING [ROUNDS]
 //
-// Prints one line for the recording, "recording PACKETS BYTES" (bytes of packets), and one for each
-// way through it, "WAY SECONDS BYTES" (processor time and bytes written): the least of all
-// rounds, each of which goes every way once, so that a busy machine disturbs all ways alike.
+// Prints one line for the recording, "recording PACKETS BYTES" (bytes of packets), and one line for
+// each way of reading it, "WAY SECONDS BYTES" (processor time and bytes written): the best of all
+// rounds. Each round runs every way once, so that a busy machine affects all ways alike.
 
 #include "LogGenerator/LogPacket.h"
 #include "LogGenerator/Technologies/Technologies.h"
@@ -39,9 +39,9 @@ struct Contents {
     std::uint64_t bytes = 0;
 };
 
-volatile std::uint64_t sumOfLogCodes = 0; // so that each has to be looked at
+volatile std::uint64_t sumOfLogCodes = 0; // so that the loop is not optimized away
 
-/// The least that any reader of the recording has to do.
+/// The minimum work of any reader of the recording.
 Contents loopBare(const std::string& path) {
     std::array<char, PCAP_ERRBUF_SIZE> error{};
     pcap_t* const capture = pcap_open_offline(path.c_str(), error.data());
@@ -90,7 +90,7 @@ struct Way {
     std::uint64_t written = 0;
 };
 
-/// Of this process: what else runs on the machine disturbs it less than the time of day.
+/// Of this process; less affected by other programs than wall-clock time.
 double processorSeconds() {
     timespec time{};
     (void)::clock_gettime(CLOCK_PROCESS_CPUTIME_ID, &time);
@@ -117,7 +117,7 @@ int main(int argc, char** argv) {
     }
     const std::string path = argv[1];
     const long rounds = argc == 3 ? std::strtol(argv[2], nullptr, 10) : kRounds;
-    const Contents contents = loopBare(path); // the file is in memory from here on
+    const Contents contents = loopBare(path); // also loads the file into memory
     std::array ways = {
         Way{"bare", Every::End, DecodeFormat::Json, true},
         Way{"end", Every::End, DecodeFormat::Json},

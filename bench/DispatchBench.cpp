@@ -1,5 +1,6 @@
-// Framing alone, and the way of one packet through the GSM/UMTS generator: framing, the subscribers
-// of its code, one record or several, of which most only keep it until somebody looks.
+// Framing alone, and the path of one packet through the GSM/UMTS generator: framing, the
+// subscribers of its code, and one or several records, most of which only keep the packet until a
+// display is needed.
 
 #include "LogGenerator/LogPacket.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMLogGenerator.h"
@@ -22,8 +23,8 @@ void framing(benchmark::State& state) {
 }
 BENCHMARK(framing);
 
-/// The argument is the log code. The display is generated now and then, as ticks would have it,
-/// so that the raw capture stays small.
+/// The argument is the log code. A display is generated from time to time, like ticks, to keep the
+/// raw capture small.
 void dispatch(benchmark::State& state) {
     constexpr int kPacketsPerTick = 100;
     doubles::GeneratorFixture fixture;

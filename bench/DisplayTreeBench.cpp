@@ -8,7 +8,7 @@ namespace {
 
 constexpr NumberFormat kDbm{"%d dBm"};
 
-/// Sections of display numbers and labels, as the records fill them.
+/// Sections of display numbers and labels, as records fill them.
 PropertyList displayOf(int sections, int rows) {
     Dictionary display;
     for (int section = 0; section < sections; ++section) {

@@ -1,4 +1,4 @@
-// Nanoseconds that one LTE packet costs each record class, with a section attached and no log sink.
+// Nanoseconds per packet for each LTE record class, with a section attached and no log sink.
 
 #include "LogGenerator/LTE/ConnectedModeMeasurementMisc.h"
 #include "LogGenerator/LTE/DetectedCells.h"
@@ -28,12 +28,12 @@ Record idleNeighbours() {
     return Record(0xB180).padTo(19).u16(kCountField).padTo(21 + kCount * 20);
 }
 
-/// Eight candidates of LTE.
+/// Eight LTE candidates.
 Record candidates() {
     return Record(0xB186).padTo(21 + 8 * 4 + 4).at(19, 8);
 }
 
-/// A serving cell with the numbers that are read of it.
+/// A serving cell with all numbers that are read.
 Record lteCellMonitor() {
     Dictionary cell;
     cell.setFixed(kHXCellMonitorCellRadioAccessTechnology,

@@ -10,7 +10,7 @@ namespace pallax {
 
 using doubles::Record;
 
-/// What one packet costs a record class that has a section.
+/// The cost of one packet for a record class with a section.
 template <class RecordClass, Record (*makePacket)()>
 void measure(benchmark::State& state) {
     ClassDict classDict;
@@ -30,7 +30,7 @@ void measure(benchmark::State& state) {
     state.SetItemsProcessed(state.iterations());
 }
 
-/// Nothing but zeros behind the header.
+/// Only zeros after the header.
 template <LogCode logCode, std::size_t length>
 Record zeros() {
     return Record(logCode).padTo(length);

@@ -1,5 +1,5 @@
-// What one picture of the object stream costs: reading the message, and making its display form,
-// which the generator does when somebody looks.
+// The cost of one message of the object stream: reading it, and building its display form, which
+// the generator does only when a display is needed.
 
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "plist/PropertyListCodec.h"
@@ -25,7 +25,7 @@ PropertyList cell(int number) {
     };
 }
 
-/// A serving cell and a full list of neighbours, with what folds and what does not.
+/// A serving cell and a full list of neighbours, with and without dictionaries of one entry.
 PropertyList picture() {
     Array neighbours = {"header"};
     for (int number = 1; number <= kNeighbours; ++number) {
@@ -68,7 +68,7 @@ void updateText(benchmark::State& state) {
 }
 BENCHMARK(updateText);
 
-/// The display form alone, of the object that has been read.
+/// Only the display form of an object that has been read.
 void processObject(benchmark::State& state) {
     const PropertyList object = picture();
     for ([[maybe_unused]] const auto turn : state) {

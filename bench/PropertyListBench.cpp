@@ -1,5 +1,5 @@
-// Reading and writing a cell-monitor array of 200 cells, the largest list that a modem's service
-// sends every few seconds.
+// Reading and writing a cell-monitor array of 200 cells, the largest list that the telephony
+// service sends every few seconds.
 
 #include "plist/PropertyListCodec.h"
 

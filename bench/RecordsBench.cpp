@@ -1,4 +1,4 @@
-// Nanoseconds that one packet costs each record class, with a section attached and no log sink.
+// Nanoseconds per packet for each record class, with a section attached and no log sink.
 
 #include "LogGenerator/Common/PDPContextList.h"
 #include "LogGenerator/Common/SimInfo.h"
@@ -47,12 +47,12 @@ Record searcherCells() {
     return record;
 }
 
-/// Eight UMTS entries, and eight GSM entries over the same bytes.
+/// Eight UMTS entries, and eight GSM entries in the same bytes.
 Record rankedCells() {
     return Record(0x4005).padTo(15 + 8 * 10).at(13, 8).at(14, 8);
 }
 
-/// A serving cell and two neighbours with the numbers that are read of them.
+/// A serving cell and two neighbours with all numbers that are read.
 Record cellMonitor() {
     const auto cell = [](std::string_view type) {
         Dictionary numbers;
@@ -100,7 +100,7 @@ Record gsmMeasurement() {
     return record;
 }
 
-/// The BSICs of those six.
+/// The BSICs of the six neighbours.
 Record bsicList() {
     Record record(0x51FF);
     record.padTo(15 + kGsmNeighbours * 4).at(14, kGsmNeighbours);
@@ -165,7 +165,7 @@ Record gsmCellMonitor() {
     return Record(0xFF0001).append(Bytes(*bytes));
 }
 
-/// The fourteen files that are shown.
+/// The fourteen files that the display shows.
 Record simFiles() {
     Dictionary files;
     for (const std::string_view file :
@@ -184,7 +184,7 @@ Record packetDataContexts() {
     return Record(0xFF0002).append(Bytes(*bytes));
 }
 
-/// Neighbours whose BSICs have been told.
+/// Neighbours with known BSICs.
 void measureNeighboursWithBsics(benchmark::State& state) {
     NeighboringCells record;
     record.updateSectionRef(Array());

@@ -23,7 +23,7 @@ public:
     ui::NavigationStack* stack = nullptr;
 };
 
-/// Sections of rows; every second value is another one at each tick.
+/// Sections of rows; every second value changes at each tick.
 PropertyList displayOf(int sections, int rows, std::int64_t tick) {
     Dictionary display;
     for (int section = 0; section < sections; ++section) {
@@ -37,8 +37,8 @@ PropertyList displayOf(int sections, int rows, std::int64_t tick) {
     return display;
 }
 
-/// From a display to the drawn screen: tree, reload of both panes, drawing. `filter` is typed
-/// into the upper pane before.
+/// From a display to the drawn screen: tree, reload of both panes, drawing. `filter` is typed into
+/// the upper pane first.
 void tick(benchmark::State& state, int sections, int rows, const std::string& filter) {
     const PropertyList displays[] = {displayOf(sections, rows, 1), displayOf(sections, rows, 2)};
     terminal::FrontEnd frontEnd({[] {}, [] {}, [](const std::string&) {}, [] {}},
@@ -91,7 +91,7 @@ void tickOf50000LeavesInOneFilteredPane(benchmark::State& state) {
 }
 BENCHMARK(tickOf50000LeavesInOneFilteredPane)->Unit(benchmark::kMillisecond);
 
-/// How the cost grows with the leaves of one pane.
+/// The cost as a function of the leaves in one pane.
 void growingTick(benchmark::State& state) {
     tick(state, 1, static_cast<int>(state.range(0)), "");
 }

@@ -1,5 +1,5 @@
-// How much of a core the telephony service uses while it streams to two clients, 2,000 packets a
-// second to each. Usage: service_bench [SECONDS]
+// The share of a core that the telephony service uses while it streams to two clients, 2,000
+// packets a second to each. Usage: service_bench [SECONDS]
 
 #include "host/AsioMainQueue.h"
 #include "host/RecordingWriter.h"
@@ -21,7 +21,7 @@ namespace {
 using namespace pallax;
 
 constexpr int kPacketsPerSecond = 2000;
-constexpr std::size_t kPacketSize = 100; // about what a record has
+constexpr std::size_t kPacketSize = 100; // about the size of a log record
 constexpr LogCode kCode = 0xB17F;
 constexpr int kLteLinkType = 150;
 
@@ -30,7 +30,7 @@ constexpr int kLteLinkType = 150;
     std::exit(1); // NOLINT(concurrency-mt-unsafe)
 }
 
-/// Ten seconds, to be played round and round.
+/// Ten seconds, to be played in a loop.
 void writeRecording(const std::string& path) {
     constexpr int kSeconds = 10;
     const auto writer = RecordingWriter::create(path, kLteLinkType);
@@ -50,7 +50,7 @@ void writeRecording(const std::string& path) {
     }
 }
 
-/// One client, on the queue that all share.
+/// One client, on the shared queue.
 class Client {
 public:
     Client(AsioMainQueue& queue, SocketMessagePorts& ports, const ChildService& service,
@@ -87,7 +87,7 @@ private:
     long _packets = 0;
 };
 
-/// The processor time that the process has used.
+/// The processor time of the process.
 double secondsUsedBy(pid_t process) {
     constexpr int kFieldsBefore = 13; // utime is the 14th field, stime the one after
     std::ifstream file("/proc/" + std::to_string(process) + "/stat");

@@ -1,5 +1,5 @@
-// Packets a second of each simulated modem, at 50 a second of simulated time, and of an hour of LTE
-// written as a recording.
+// Packets per second of each simulated modem, at 50 per second of simulated time, and for an hour
+// of LTE written as a recording.
 
 #include "host/Recording.h"
 #include "simulator/SimulatedRecording.h"

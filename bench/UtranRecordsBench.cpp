@@ -1,4 +1,4 @@
-// Nanoseconds that one packet costs each record class of UTRAN.
+// Nanoseconds per packet for each UTRAN record class.
 
 #include "LogGenerator/UTRAN/CCTRCHSIRMeasurement.h"
 #include "LogGenerator/UTRAN/GSMNeighbhorMeasurements.h"
@@ -26,7 +26,7 @@ Record channels() {
     return Record(0xD00C).padTo(289 + 34 * 8 + 4 * 8).at(15, 4 << 4 | 8 >> 2);
 }
 
-/// A serving cell with the numbers that are read of it.
+/// A serving cell with all numbers that are read.
 Record cellMonitor() {
     Dictionary cell;
     cell.setFixed(kHXCellMonitorCellRadioAccessTechnology,

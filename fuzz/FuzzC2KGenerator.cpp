@@ -1,4 +1,4 @@
-// The whole CDMA generator under any sequence of packets; see GeneratorFuzz.h for the input.
+// The CDMA generator with any sequence of packets; see GeneratorFuzz.h for the input.
 
 #include "LogGenerator/C2K/C2KLogGenerator.h"
 #include "fuzz/GeneratorFuzz.h"
@@ -17,7 +17,7 @@ Dictionary rows(std::initializer_list<const char*> lookupNames) {
     return section;
 }
 
-/// Every lookup name, in sections as in resources/C2KTemplate.plist.
+/// Every lookup name, in the sections of resources/C2KTemplate.plist.
 PropertyList displayTemplate() {
     return Dictionary{
         {"System Identity", rows({"kSystemId", "kNetworkId", "kBaseId", "kPacketZoneId",

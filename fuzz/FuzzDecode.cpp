@@ -51,7 +51,7 @@ void decode(RecordingDecoder& decoder, Bytes input) {
     while (input.size() >= kHeader) {
         const std::size_t length = std::min<std::size_t>(number(input, 0), input.size() - kHeader);
         time += std::chrono::milliseconds(100) * static_cast<std::int16_t>(number(input, 2));
-        // A copy of its own, so that a sanitizer sees a read past the packet.
+        // A separate copy, so that a sanitizer detects reads past the packet.
         const Bytes packet = input.subspan(kHeader, length);
         const ByteBuffer copy(packet.begin(), packet.end());
         (void)decoder.add({time, copy});

@@ -1,4 +1,4 @@
-// The whole GSM/UMTS generator under any sequence of packets; see GeneratorFuzz.h for the input.
+// The GSM/UMTS generator with any sequence of packets; see GeneratorFuzz.h for the input.
 
 #include "LogGenerator/ZOR_GSM/ZOR_GSMLogGenerator.h"
 #include "fuzz/GeneratorFuzz.h"

@@ -1,5 +1,5 @@
-// The IFX generator under any sequence of messages; see GeneratorFuzz.h for the input. A message
-// is displayed or leaves the state as it was; everything else ends the run.
+// The IFX generator with any sequence of messages; see GeneratorFuzz.h for the input. A message is
+// displayed or leaves the state unchanged; any other outcome aborts.
 
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 #include "fuzz/GeneratorFuzz.h"
@@ -16,7 +16,8 @@ void require(bool holds) {
     }
 }
 
-/// Strings, arrays and dictionaries, and no dictionary of one entry below the top.
+/// Checks that there are only strings, arrays and dictionaries, and no dictionary of one entry
+/// below the top.
 void requireDisplayForm(const PropertyList& object, bool isTop) {
     if (const ArrayRef elements = object.array()) {
         for (const PropertyList& element : *elements) {
@@ -32,14 +33,14 @@ void requireDisplayForm(const PropertyList& object, bool isTop) {
     }
 }
 
-/// Where the state's values are: an equal copy in their place would be a change.
+/// The addresses of the state's values: an equal copy in their place would be a change.
 struct Stored {
     explicit Stored(const Dictionary& state)
         : display(place(state, "Display")), displayState(place(state, "DisplayState")),
           extraInfo(place(state, "ExtraInfo")), keys(state.size()) {}
     friend bool operator==(const Stored&, const Stored&) = default;
 
-    /// Of an array or a dictionary; null for a string.
+    /// The address of an array or a dictionary; null for a string.
     static const void* place(const Dictionary& state, const char* key) {
         const PropertyList* found = state.find(key);
         if (found == nullptr) {
@@ -56,7 +57,7 @@ struct Stored {
 };
 
 void feed(LogGenerator& generator, Dictionary& state, Bytes packet) {
-    const ByteBuffer message(packet.begin(), packet.end()); // of its own, for a sanitizer
+    const ByteBuffer message(packet.begin(), packet.end()); // a separate copy for the sanitizer
     const Stored before(state);
     try {
         generator.updateState(state, message);

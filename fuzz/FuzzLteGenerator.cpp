@@ -1,4 +1,4 @@
-// The whole LTE generator under any sequence of packets; see GeneratorFuzz.h for the input.
+// The LTE generator with any sequence of packets; see GeneratorFuzz.h for the input.
 
 #include "LogGenerator/LTE/LTELogGenerator.h"
 #include "fuzz/GeneratorFuzz.h"

@@ -1,5 +1,5 @@
-// The framing of message ports: whatever bytes come, in whatever pieces, the parser reads the
-// same frames, keeps its memory bound, and what it has read can be written back.
+// The framing of message ports: for any bytes in any pieces, the parser reads the same frames and
+// respects its memory limit, and the frames can be written back.
 
 #include "host/PortFrame.h"
 

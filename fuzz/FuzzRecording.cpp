@@ -1,5 +1,5 @@
-// A recording's file, pcap or pcapng, of any bytes: it is opened or refused with one sentence,
-// every packet lies in memory that may be read, and a recording that ends early says so.
+// A recording of any bytes, pcap or pcapng: it is opened or refused with one sentence, every packet
+// is in readable memory, and a recording that ends early says so.
 
 #include "host/Recording.h"
 
@@ -13,7 +13,7 @@ namespace {
 
 using namespace pallax;
 
-/// A file in memory under a name that can be opened.
+/// A file in memory with a name that can be opened.
 class MemoryFile {
 public:
     explicit MemoryFile(Bytes content) : _descriptor(::memfd_create("recording", MFD_CLOEXEC)) {

@@ -1,8 +1,8 @@
-// A client of the telephony service that sends anything: the bytes go through a real socket to a
-// real service, to its control port or to the port of a log channel that was opened in order; the
-// service must live on, answer the next client and keep no channel without its client. The input:
-// a byte of choices (1: raw bytes, not frames; 2: to the channel's port), then what is sent, frames
-// as told at framesOf.
+// A client of the telephony service that sends any bytes, through a real socket to a real service:
+// to its control port, or to the port of a properly opened log channel. The service must stay
+// alive, answer the next client and keep no channel without its client. The input: a byte of
+// choices (1: raw bytes, not frames; 2: to the channel's port), then the data to send, as frames
+// described at framesOf.
 
 #include "host/AsioMainQueue.h"
 #include "host/PortFrame.h"
@@ -28,7 +28,7 @@ using namespace pallax;
     std::abort();
 }
 
-/// What a channel plays.
+/// The source of a channel.
 class TwoPackets final : public PacketSource {
 public:
     std::string technology() const override { return "Zorell_LTE"; }
@@ -64,7 +64,7 @@ SocketDirectory folder() {
     return std::move(directory).value();
 }
 
-/// A service in a folder of its own, which goes with the process.
+/// A service in its own folder, which is removed with the process.
 class RunningService {
 public:
     RunningService() {
@@ -91,7 +91,7 @@ public:
     RunningService(const RunningService&) = delete;
     RunningService& operator=(const RunningService&) = delete;
 
-    /// Sends the bytes and gives what is answered until the service has taken all and is at rest.
+    /// Sends the bytes and returns the answer once the service has read everything and is idle.
     ByteBuffer exchange(const std::string& port, Bytes bytes) {
         const int peer = connect(port);
         if (peer < 0) {
@@ -104,7 +104,7 @@ public:
             if (sent > 0) {
                 bytes = bytes.subspan(static_cast<std::size_t>(sent));
             } else if (errno != EAGAIN) {
-                break; // cut off
+                break; // disconnected
             }
             _queue.runReady();
         }
@@ -123,7 +123,7 @@ public:
 
     std::size_t channels() const { return _server->channelCount(); }
 
-    /// The port of a new log channel, whose packets go to `receiver`; nothing is done with them.
+    /// The port of a new log channel, whose packets go to `receiver` and are ignored.
     std::string openChannel(std::unique_ptr<LocalMessagePort>& receiver) {
         receiver =
             _ports.createLocal("receiver", [](std::int32_t, Bytes) { return std::nullopt; }).port;
@@ -135,7 +135,7 @@ public:
         return *channel->remotePortName;
     }
 
-    /// The answer to a request in order; nothing when there is none.
+    /// The answer to a proper request; nothing if there is none.
     std::optional<LogChannel> askForChannel(std::string_view receiver) {
         ByteBuffer request;
         appendFrame(request, {FrameKind::Request, 0, 1, std::nullopt},
@@ -168,7 +168,7 @@ private:
     std::unique_ptr<TelephonyServer> _server;
 };
 
-/// A byte for the kind, one for the identifier, two for the length, then the message; and so on.
+/// A sequence of: a byte for the kind, one for the identifier, two for the length, the message.
 ByteBuffer framesOf(Bytes input) {
     constexpr std::size_t kHeader = 4;
     ByteBuffer bytes;

@@ -1,5 +1,5 @@
-// The settings file: any text is taken or refused with one sentence that names file and line, and
-// what is taken holds no line's end.
+// The settings file: any text is accepted, or refused with one sentence that names file and line;
+// accepted values contain no line end.
 
 #include "link/Settings.h"
 

@@ -1,5 +1,5 @@
-// The terminal front end: whatever keys, sizes and data come, in whatever order, every screen can
-// be shown by a terminal and the cursor stands on a row.
+// The terminal front end: for any keys, sizes and data in any order, a terminal can show every
+// screen and the cursor is on a row.
 
 #include "tests/ui/terminal/StageScript.h"
 

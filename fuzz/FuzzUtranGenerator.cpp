@@ -1,4 +1,4 @@
-// The whole UTRAN generator under any sequence of packets; see GeneratorFuzz.h for the input.
+// The UTRAN generator with any sequence of packets; see GeneratorFuzz.h for the input.
 
 #include "LogGenerator/UTRAN/UTRANLogGenerator.h"
 #include "fuzz/GeneratorFuzz.h"

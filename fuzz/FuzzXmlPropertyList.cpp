@@ -1,5 +1,5 @@
-// Property lists in XML: any text is read or refused, what is read can be written and read again,
-// and what the quick reader of plain texts takes, the whole reader reads alike.
+// Property lists in XML: any text is read or refused, values that were read can be written and read
+// again, and the full reader gives the same result for texts that the plain reader accepts.
 
 #include "fuzz/PropertyListCheck.h"
 #include "plist/PlainXmlReader.h"

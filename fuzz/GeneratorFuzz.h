@@ -13,7 +13,7 @@
 
 namespace pallax {
 
-/// Has the text of every log line made.
+/// Formats the text of every log line.
 class Listener final : public LogSink {
 public:
     Listener() { SystemLog::setSink(this); }
@@ -23,7 +23,7 @@ public:
     void write(LogPriority /*priority*/, std::string_view /*text*/) override {}
 };
 
-/// The next packet of `input`, which is moved behind it.
+/// The next packet of `input`, which is advanced past it.
 inline Bytes takePacket(Bytes& input) {
     constexpr std::size_t kLengthBytes = 2;
     const LogRecord head(input);
@@ -34,13 +34,12 @@ inline Bytes takePacket(Bytes& input) {
     return packet;
 }
 
-/// The text of the display after the packets, which makes that of every value; a snapshot is made
-/// of it too.
+/// The text of the display after the packets, which formats every value; also makes a snapshot.
 inline std::string displayAfter(Bytes input, LogGenerator& generator) {
     Dictionary state;
     while (!input.empty()) {
         const Bytes packet = takePacket(input);
-        // A copy of its own, so that a sanitizer sees a read past the packet.
+        // A separate copy, so that a sanitizer detects reads past the packet.
         const ByteBuffer message(packet.begin(), packet.end());
         try {
             generator.updateState(state, message);
@@ -52,13 +51,13 @@ inline std::string displayAfter(Bytes input, LogGenerator& generator) {
     return display.description();
 }
 
-/// A generator under any sequence of packets, up to the display and what a snapshot would save.
-/// The input is packets behind each other, each behind its length (16 bits, little-endian; the
-/// last one may be cut). Whether somebody reads the log, so that each record is read when it
-/// arrives, or nobody, so that some are kept, the display must be the same.
+/// A generator with any sequence of packets, up to the display and the contents of a snapshot. The
+/// input is a sequence of packets, each after its length (16 bits, little-endian; the last one may
+/// be cut). The display must be the same with a log sink, when each log record is read on arrival,
+/// and without, when some are kept.
 ///
-/// The one exception that a record may throw is that of a SIM-file record whose property list
-/// cannot be parsed. Everything else, an index past a record's own count above all, ends the run.
+/// A record may only throw the exception of a SIM-file record whose property list cannot be parsed.
+/// Any other exception, above all an index past a log record's own count, aborts.
 inline void fuzzGenerator(Bytes input, decltype(Technology::generator) makeGenerator,
                           const std::string& templateName, PropertyList displayTemplate) {
     doubles::GeneratorFixture fixture;

@@ -8,9 +8,9 @@
 
 namespace pallax {
 
-/// Ends the process, for the fuzzer to see, unless `object` is written in every form that accepts
-/// it and reads back as the same. What was read differs from itself only by a not-a-number real,
-/// or by a foreign key, which no writer accepts.
+/// Aborts unless `object` is written in every form that accepts it and reads back equal. An object
+/// that was read differs from itself only if it contains a not-a-number real or a foreign key,
+/// which no writer accepts.
 inline void requireSameAfterWriting(const PropertyList& object) {
     const PropertyList copy = object;
     const bool comparable = object == copy;

@@ -1,5 +1,5 @@
-// Runs a fuzz target over every file of a corpus folder, each also cut at every length, so that
-// the corpus is a test wherever the fuzzer is not.
+// Runs a fuzz target over every file of a corpus folder, each also cut at every length, so that the
+// corpus is tested even without the fuzzer.
 
 #include <cstddef>
 #include <cstdint>
@@ -20,7 +20,7 @@ std::vector<std::uint8_t> contentOf(const std::filesystem::path& path) {
 
 void replay(const std::vector<std::uint8_t>& content) {
     for (std::size_t length = 0; length < content.size(); ++length) {
-        // A copy of its own, so that a sanitizer sees a read past the cut.
+        // A separate copy, so that a sanitizer detects reads past the cut.
         const std::vector<std::uint8_t> cut(content.begin(),
                                             content.begin() + static_cast<std::ptrdiff_t>(length));
         (void)LLVMFuzzerTestOneInput(cut.data(), cut.size());

@@ -9,7 +9,7 @@ namespace pallax::binary_form {
 
 namespace {
 
-// In the trailer.
+// Offsets in the trailer.
 constexpr std::size_t kOffsetWidthAt = 6;
 constexpr std::size_t kReferenceWidthAt = 7;
 constexpr std::size_t kObjectCountAt = 8;

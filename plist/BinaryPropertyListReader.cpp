@@ -15,12 +15,12 @@ namespace {
 
 using namespace binary_form;
 
-/// An object's marker, and where its content lies.
+/// An object's marker, and the start of its content.
 struct Marker {
     std::uint8_t kind = 0;
     std::uint8_t low = 0;
     std::uint64_t content = 0;
-    std::uint64_t count = 0; ///< of the kinds that have one
+    std::uint64_t count = 0; ///< for the kinds that have one
 };
 
 class BinaryReader {
@@ -58,19 +58,19 @@ private:
     static std::string fromUtf16(std::uint64_t offset, Bytes units);
 
     Layout _layout;
-    ByteReader _objects; ///< the file up to the offset table
+    ByteReader _objects; ///< the part of the file before the offset table
     ByteReader _table;
-    std::vector<bool> _open; ///< by offset: a container that is being read
-    /// What shared references may still expand to, in values and in bytes of texts and data:
-    /// what a small file can make us build stays in proportion to it.
+    std::vector<bool> _open; ///< by offset: containers being read
+    /// How far shared references may still expand, in values and in bytes of texts and data; it
+    /// keeps the result in proportion to the size of the file.
     std::uint64_t _budget;
     std::uint64_t _payloadBudget;
-    /// Texts and data that several references share are built once, by offset.
+    /// Texts and data with several references are built once, by offset.
     std::unordered_map<std::uint64_t, Text> _texts;
     std::unordered_map<std::uint64_t, SharedBytes> _data;
 };
 
-/// Where the object of a reference starts; `referrer` is where the reference stands.
+/// The offset of a reference's object; `referrer` is the position of the reference.
 std::uint64_t BinaryReader::offsetOf(std::uint64_t reference, std::uint64_t referrer) const {
     if (reference >= _layout.objectCount) {
         refuse(referrer, "an object reference outside the object table");
@@ -83,7 +83,7 @@ std::uint64_t BinaryReader::offsetOf(std::uint64_t reference, std::uint64_t refe
     return offset;
 }
 
-/// Where the container's `index`th reference leads; the container's content has been checked.
+/// The target of the container's `index`th reference; the container's content has been checked.
 std::uint64_t BinaryReader::reference(const Marker& marker, std::uint64_t index) const {
     const std::uint64_t at = marker.content + index * _layout.referenceWidth;
     return offsetOf(*_objects.number(at, _layout.referenceWidth), at);
@@ -104,7 +104,7 @@ Marker BinaryReader::markerAt(std::uint64_t offset) const {
     return marker;
 }
 
-/// The count that follows a marker as an integer object; `content` moves past it.
+/// The count in an integer object after a marker; moves `content` past it.
 std::uint64_t BinaryReader::longCount(std::uint64_t offset, std::uint64_t& content) const {
     const auto byte = _objects.number(content, 1);
     if (!byte || (*byte >> 4U) != kInteger || (*byte & 0xFU) > kEightBytes) {
@@ -198,7 +198,7 @@ void BinaryReader::addEntry(Dictionary& entries, std::uint64_t keyOffset, Proper
     }
     const PropertyList key = scalar(keyOffset, marker);
     if (marker.kind == kData) {
-        spendPayload(keyOffset, marker.count); // its printed form is made for each use
+        spendPayload(keyOffset, marker.count); // its printed form is built for each use
     }
     entries.appendForeignKey(key, std::move(value));
 }
@@ -242,8 +242,8 @@ PropertyList BinaryReader::singleton(std::uint64_t offset, const Marker& marker)
     }
 }
 
-/// Of 1, 2 or 4 bytes unsigned; of 8 bytes signed; of 16 bytes signed too, and read when 64 bits
-/// hold the number, with or without a sign.
+/// 1, 2 or 4 bytes are unsigned, 8 bytes signed. 16 bytes are signed, and accepted if the number
+/// fits 64 bits, signed or unsigned.
 PropertyList BinaryReader::integer(std::uint64_t offset, const Marker& marker) const {
     if (marker.low > kSixteenBytes) {
         refuse(offset, "an integer wider than 16 bytes");
@@ -288,7 +288,7 @@ PropertyList BinaryReader::date(std::uint64_t offset, const Marker& marker) cons
     const double seconds = std::floor(real(offset, marker));
     const auto least = static_cast<double>((kFirstDate - kReferenceDate).count());
     const auto end = static_cast<double>((kDateEnd - kReferenceDate).count());
-    if (!(seconds >= least && seconds < end)) { // so written that a NaN is refused
+    if (!(seconds >= least && seconds < end)) { // negated, so that a NaN is refused
         refuse(offset, "a date outside the years 0 to 9999");
     }
     return kReferenceDate + std::chrono::seconds(static_cast<std::int64_t>(seconds));

@@ -92,7 +92,7 @@ std::string encodedScalar(const PropertyList& object) {
     return out;
 }
 
-/// Numbers the objects in the order in which they are met, the root first, then writes them.
+/// Numbers the objects in the order of the walk, the root first, then writes them.
 class BinaryWriter {
 public:
     ByteBuffer write(const PropertyList& object) {
@@ -105,7 +105,7 @@ private:
     struct Object {
         const std::string* scalar = nullptr; ///< a key of `_scalars`
         Kind kind = kArray;
-        std::vector<std::uint32_t> references; ///< of a dictionary all keys, then all values
+        std::vector<std::uint32_t> references; ///< for a dictionary, all keys, then all values
     };
 
     std::uint32_t add(const PropertyList& object, std::size_t depth);
@@ -118,10 +118,10 @@ private:
 
     std::vector<Object> _objects;
     std::unordered_map<std::string, std::uint32_t> _scalars; ///< encoding to object
-    std::size_t _size = 0;                                   ///< at least what will be written
+    std::size_t _size = 0;                                   ///< lower bound of the output's size
 };
 
-/// What is larger could not be read back; shared containers can make it so.
+/// Refuses an output that is too large to be read back; shared containers can cause it.
 void BinaryWriter::spend(std::size_t size) {
     _size += size;
     if (_size > kLargestPropertyList) {

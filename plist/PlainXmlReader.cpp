@@ -21,7 +21,8 @@ constexpr bool isPlain(char letter) {
     return (letter >= ' ' && letter <= '~' && letter != '&') || letter == '\t' || letter == '\n';
 }
 
-/// Takes the text from its beginning. Once something is not plain, every function gives nothing.
+/// Consumes the text from its beginning. Once something is not plain, every function returns
+/// nothing.
 class PlainXmlReader {
 public:
     explicit PlainXmlReader(std::string_view rest) : _rest(rest) {}
@@ -58,7 +59,7 @@ private:
         }
     }
 
-    /// The text up to the end tag, which is taken too.
+    /// The text before the end tag; also consumes the tag.
     std::optional<std::string_view> textUntil(std::string_view endTag) {
         std::size_t end = 0;
         while (end < _rest.size() && _rest[end] != '<') {
@@ -149,7 +150,7 @@ private:
         return entries;
     }
 
-    /// Keys come again and again in a list; the first ones are kept to be shared.
+    /// Keys repeat in a list; the first ones are kept to be shared.
     Text sharedKey(std::string_view key) {
         constexpr std::size_t kMostKept = 32;
         for (const Text& kept : _keys) {

@@ -9,7 +9,7 @@ namespace {
 constexpr std::string_view kBinarySignature = "bplist";
 constexpr std::string_view kSpaces = " \t\r\n";
 
-/// The first bytes as text, which is all that telling the forms apart needs.
+/// The first bytes as text, enough to detect the form.
 std::string headOf(Bytes bytes, std::size_t start, std::size_t length) {
     std::string head;
     for (std::size_t at = start; at < bytes.size() && at - start < length; ++at) {
@@ -18,11 +18,11 @@ std::string headOf(Bytes bytes, std::size_t start, std::size_t length) {
     return head;
 }
 
-/// Data of the text form begins with "<" too, but goes on with a hex digit, white space or ">".
+/// Data in the text form also begins with "<", but continues with a hex digit, white space or ">".
 bool looksLikeXml(Bytes bytes) {
     const std::string mark = headOf(bytes, 0, kUtf8Mark.size());
     if (mark.starts_with("\xFE\xFF") || mark.starts_with("\xFF\xFE")) {
-        return true; // UTF-16, which the XML reader refuses by its name
+        return true; // UTF-16, which the XML reader refuses with a specific error
     }
     std::size_t at = mark == kUtf8Mark ? kUtf8Mark.size() : 0;
     while (at < bytes.size() &&

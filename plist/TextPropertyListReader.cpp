@@ -39,7 +39,7 @@ bool isOctal(char letter) {
     return letter >= '0' && letter <= '7';
 }
 
-/// The character that a backslash and `letter` stand for, or nothing.
+/// The character for a backslash and `letter`, if any.
 std::optional<char> simpleEscape(char letter) {
     constexpr std::string_view kLetters = "abfnrtv\"'\\\n";
     constexpr std::string_view kMeanings = "\a\b\f\n\r\t\v\"'\\\n";
@@ -95,7 +95,7 @@ void TextReader::skipSpace() {
     }
 }
 
-/// False where there is none; afterwards the reader may stand at the end.
+/// False if there is no comment; afterwards the reader may be at the end.
 bool TextReader::skipComment() {
     const std::string_view rest = _text.substr(_at);
     if (rest.starts_with("//")) {
@@ -278,7 +278,7 @@ char32_t TextReader::octal() {
     return number;
 }
 
-/// The code point behind a "\U", which two escapes make where it takes a surrogate pair.
+/// The code point after "\U"; two escapes together if they are a surrogate pair.
 char32_t TextReader::unicode() {
     const std::size_t start = _at - 2;
     const char32_t unit = unicodeUnit();

@@ -16,7 +16,7 @@ constexpr std::string_view kUtf16BigEndianMark = "\xFE\xFF";
 constexpr std::string_view kUtf16LittleEndianMark = "\xFF\xFE";
 constexpr auto kEntities = std::to_array<std::string_view>({"amp", "lt", "gt", "quot", "apos"});
 
-/// A printable ASCII character or a new line or tabulator.
+/// A printable ASCII character, a newline or a tab.
 constexpr bool needsNoCheck(char letter) {
     return (letter >= ' ' && letter <= '~') || letter == '\n' || letter == '\t';
 }
@@ -26,7 +26,7 @@ void checkCharacters(std::string_view xml) {
         refuse(0, "UTF-16, where only UTF-8 is read");
     }
     for (std::size_t at = 0; at < xml.size();) {
-        if (needsNoCheck(xml[at])) { // almost every one; half of the check's time was utf8At's
+        if (needsNoCheck(xml[at])) { // the usual case; utf8At took half of the check's time
             ++at;
             continue;
         }
@@ -57,7 +57,7 @@ void checkCharacterReference(std::size_t offset, std::string_view digits) {
     }
 }
 
-/// Checks the reference whose "&" is at `at`; returns where it ends.
+/// Checks the reference whose "&" is at `at`; returns its end.
 std::size_t checkReference(std::string_view xml, std::size_t at) {
     const std::size_t end = xml.find_first_of(";&<> \t\r\n\"'", at + 1);
     if (end == std::string_view::npos || xml[end] != ';') {
@@ -72,8 +72,8 @@ std::size_t checkReference(std::string_view xml, std::size_t at) {
     return end + 1;
 }
 
-/// Just past the first `terminator` from `at` on, or the end: what lacks its end is left to the
-/// parser.
+/// The position after the first `terminator` from `at` on, or the end: the parser reports a missing
+/// terminator.
 std::size_t pastNext(std::string_view xml, std::size_t at, std::string_view terminator) {
     const std::size_t found = xml.find(terminator, at);
     return found == std::string_view::npos ? xml.size() : found + terminator.size();
@@ -85,7 +85,7 @@ bool equalIgnoringCase(std::string_view text, std::string_view upper) {
     });
 }
 
-/// A declaration (`<?xml … ?>`) that names its encoding must name UTF-8 or a subset of it.
+/// If a declaration (`<?xml … ?>`) names an encoding, it must be UTF-8 or a subset.
 void checkDeclaration(std::size_t offset, std::string_view declaration) {
     constexpr std::string_view kEncoding = "encoding";
     const std::size_t found = declaration.find(kEncoding);
@@ -103,7 +103,7 @@ void checkDeclaration(std::size_t offset, std::string_view declaration) {
     }
 }
 
-/// Skips a document type, which is never fetched; one that declares anything itself is refused.
+/// Skips a document type, which is never fetched; refuses one with declarations.
 std::size_t skipDocumentType(std::string_view xml, std::size_t at) {
     for (++at; at < xml.size() && xml[at] != '>'; ++at) {
         if (xml[at] == '[' || xml[at] == '<') {
@@ -116,8 +116,8 @@ std::size_t skipDocumentType(std::string_view xml, std::size_t at) {
     return std::min(at + 1, xml.size());
 }
 
-/// Where the next tag or reference begins from `at` on, or the end. (The library's search for one
-/// of two letters calls a function for each letter that it passes.)
+/// The start of the next tag or reference from `at` on, or the end. (The library's search for one
+/// of two letters calls a function for each letter.)
 std::size_t nextMarkup(std::string_view xml, std::size_t at) {
     while (at < xml.size() && xml[at] != '<' && xml[at] != '&') {
         ++at;

@@ -16,7 +16,8 @@ namespace pallax {
 
 namespace {
 
-// White space belongs to strings; what stands beside the root element must be seen to be refused.
+// White space belongs to strings; text next to the root element must be visible in order to be
+// refused.
 constexpr unsigned kParsing = pugi::parse_cdata | pugi::parse_escapes | pugi::parse_eol |
                               pugi::parse_ws_pcdata | pugi::parse_fragment;
 
@@ -38,7 +39,7 @@ bool isDigit(char letter) {
     return letter >= '0' && letter <= '9';
 }
 
-/// Whether the sign that is taken is a minus.
+/// Takes a sign; returns whether it is a minus.
 bool takeSign(std::string_view& text) {
     const bool negative = text.starts_with('-');
     if (negative || text.starts_with('+')) {
@@ -68,7 +69,7 @@ PropertyList parseInteger(std::size_t offset, std::string_view text) {
                : PropertyList::unsignedInteger(magnitude);
 }
 
-/// "nan", "inf" and "infinity" in any case; nothing for everything else.
+/// "nan", "inf" and "infinity" in any case; nothing for any other text.
 std::optional<double> parseSpecialReal(std::string_view text) {
     std::string lower(text);
     std::transform(lower.begin(), lower.end(), lower.begin(), [](char letter) {
@@ -90,7 +91,7 @@ double parseReal(std::size_t offset, std::string_view text) {
     if (const auto special = parseSpecialReal(digits)) {
         number = *special;
     } else {
-        // Beyond digits, std::from_chars would take a second sign and "nan(…)".
+        // Besides digits, std::from_chars would accept a second sign and "nan(…)".
         const bool plain = !digits.empty() && (digits[0] == '.' || isDigit(digits[0]));
         const char* const last = digits.data() + digits.size();
         const auto [end, error] = std::from_chars(digits.data(), last, number);
@@ -104,7 +105,7 @@ double parseReal(std::size_t offset, std::string_view text) {
     return negative ? -number : number;
 }
 
-/// Turns the parsed elements into values; offsets are those of the input, from its first byte.
+/// Turns the parsed elements into values; offsets count from the first byte of the input.
 class XmlReader {
 public:
     explicit XmlReader(std::size_t start) : _start(start) {}
@@ -130,12 +131,12 @@ std::size_t XmlReader::offsetOf(pugi::xml_node node) const {
     if (offset < 0) {
         return _start;
     }
-    // The parser gives the place of an element's name, which follows its "<".
+    // The parser gives the position of an element's name, after its "<".
     const std::size_t bracket = node.type() == pugi::node_element ? 1 : 0;
     return _start + static_cast<std::size_t>(offset) - bracket;
 }
 
-/// False for white space between elements, the only text that may stand there.
+/// False for white space between elements, the only text allowed there.
 bool XmlReader::isElement(pugi::xml_node node) const {
     if (node.type() == pugi::node_element) {
         return true;
@@ -146,7 +147,7 @@ bool XmlReader::isElement(pugi::xml_node node) const {
     return false;
 }
 
-/// The whole text of an element that holds nothing else; comments and sections may part it.
+/// The whole text of an element without children; comments and CDATA sections may split it.
 std::string XmlReader::textOf(pugi::xml_node element) const {
     std::string text;
     for (const pugi::xml_node child : element.children()) {
@@ -276,7 +277,7 @@ PropertyList readXml(Bytes bytes) {
     checkXmlMarkup(text);
     const std::size_t start = text.starts_with(kUtf8Mark) ? kUtf8Mark.size() : 0;
     pugi::xml_document document;
-    // With the terminating null, which the parser would else put in place of the last byte.
+    // Includes the terminating null; otherwise the parser would overwrite the last byte with one.
     const pugi::xml_parse_result parsed = document.load_buffer_inplace(
         text.data() + start, text.size() - start + 1, kParsing, pugi::encoding_utf8);
     if (!parsed) {

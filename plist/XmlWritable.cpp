@@ -13,7 +13,7 @@ namespace pallax {
 
 namespace {
 
-/// The text with the replacements; nothing when it needs none.
+/// The text with replacements; nothing if it needs none.
 std::optional<std::string> writableText(std::string_view text) {
     constexpr char32_t kFirstForbiddenOfTheEnd = 0xFFFE;
     constexpr char32_t kLastForbiddenOfTheEnd = 0xFFFF;
@@ -37,7 +37,7 @@ public:
 
     explicit Replacement(const Replaced& replaced) : _replaced(replaced) {}
 
-    /// Nothing for what is writable as it is, and for what is nested too deep to be written at all.
+    /// Nothing if the object is writable as it is, or nested too deep to be written at all.
     std::optional<PropertyList> of(const PropertyList& object, const std::string& path,
                                    std::size_t depth = 1) {
         if (depth > kDeepestPropertyList) {
@@ -79,12 +79,13 @@ private:
         Dictionary copy;
         for (const Dictionary::Entry& entry : entries) {
             if (!entry.hasStringKey) {
-                return std::nullopt; // cannot be written whatever its texts are
+                return std::nullopt; // cannot be written in any case
             }
             auto key = writableText(entry.key.view());
             if (key) {
                 while (entries.contains(*key) || copy.contains(*key)) {
-                    *key += formatText(" (%zu)", {copy.size() + 1}); // no entry replaces another
+                    *key += formatText(" (%zu)", {copy.size() + 1}); // so that no entry replaces
+                                                                     // another
                 }
             }
             const std::string place = path + "/" + (key ? *key : std::string(entry.key.view()));

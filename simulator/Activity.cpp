@@ -36,7 +36,7 @@ Span spanOf(Phase phase) {
     return {};
 }
 
-/// Of the first idle period, so that a session comes soon.
+/// Short, so that the first session comes soon.
 constexpr Span kFirstIdle = {milliseconds(4000), milliseconds(6000)};
 
 milliseconds durationOf(const Span& span, Random& random) {

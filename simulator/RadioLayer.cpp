@@ -7,21 +7,21 @@ namespace pallax {
 
 namespace {
 
-// Loss in a city at 2 GHz: 128.1 dB at one kilometre, 37.6 dB more for each factor of ten.
+// Path loss in a city at 2 GHz: 128.1 dB at one kilometre, plus 37.6 dB for each factor of ten.
 constexpr double kLossAtKilometreDb = 128.1;
 constexpr double kLossPerDecadeDb = 37.6;
-constexpr double kMastHeightM = 70; // so that no cell is nearer than that
+constexpr double kMastHeightM = 70; // the minimum distance to a cell
 
 constexpr double kShadowingDb = 5;
-constexpr double kShadowingDistanceM = 110; // over which it forgets itself
-constexpr double kSmoothing = 0.5;          // part of the newest value
+constexpr double kShadowingDistanceM = 110; // the distance over which shadowing decorrelates
+constexpr double kSmoothing = 0.5;          // weight of the newest value
 
 constexpr double kHysteresisDb = 3;
-constexpr int kPatience = 4; // updates for which another cell has to be better
+constexpr int kPatience = 4; // updates for which another cell must be better
 
-/// The cells lie on a square grid, each a little off its place.
+/// The cells lie on a square grid with small random offsets.
 PlanePoint siteOf(const LayerPlan& plan, unsigned site, Random& random) {
-    constexpr double kOff = 0.18; // of the spacing
+    constexpr double kOff = 0.18; // relative to the spacing
     const double half = (plan.sitesPerSide - 1) / 2.0;
     const unsigned rowNumber = site / plan.sitesPerSide;
     const double column = site % plan.sitesPerSide + random.between(-kOff, kOff) - half;
@@ -85,7 +85,8 @@ void RadioLayer::update(PlanePoint phone, double moved_m, double shadow, Random&
 void RadioLayer::hear(std::size_t cell, double rawLevel_dbm) {
     const double wanted_dbm = std::max(rawLevel_dbm, _plan.least_dbm);
     _levels_dbm[cell] += (wanted_dbm - _levels_dbm[cell]) * kSmoothing;
-    constexpr double kBarelyHeardDb = 0.25; // the smoothing never quite reaches the least level
+    constexpr double kBarelyHeardDb = 0.25; // because the smoothing never quite reaches the lowest
+                                            // level
     if (wanted_dbm == _plan.least_dbm && _levels_dbm[cell] < wanted_dbm + kBarelyHeardDb) {
         _levels_dbm[cell] = wanted_dbm;
     }
@@ -102,7 +103,7 @@ void RadioLayer::reselect() {
     }
 }
 
-/// The strongest others, by insertion, for they are few.
+/// The strongest others, by insertion sort, because they are few.
 void RadioLayer::rankNeighbours() {
     constexpr double kDecadeDb = 10;
     _neighbourCount = 0;
@@ -121,7 +122,7 @@ void RadioLayer::rankNeighbours() {
         _neighbours[place] = cell;
         _neighbourCount = std::min(_neighbourCount + 1, kMostHeard);
     }
-    // The three strongest make nearly all of the sum.
+    // The three strongest make up nearly all of the sum.
     constexpr std::size_t kCounted = 3;
     double ratio = 1;
     for (const std::size_t cell : neighbours().first(std::min(kCounted, _neighbourCount))) {

@@ -11,7 +11,7 @@ namespace {
 constexpr int kCorners = 14;
 constexpr double kNearestM = 1100;
 constexpr double kFarthestM = 1700;
-// One fourteenth of a turn, as numbers, for sines differ between machines in the last bit.
+// One fourteenth of a turn, as constants, because sines differ between machines in the last bit.
 constexpr double kTurnCosine = 0.9009688679024191;
 constexpr double kTurnSine = 0.4338837391175581;
 
@@ -20,7 +20,7 @@ struct Hill {
     double length_m;
 };
 constexpr std::array<Hill, 3> kHills = {{{330, 260}, {2900, 420}, {5600, 300}}};
-/// Over so many metres the shadow comes and goes.
+/// The distance over which a shadow begins or ends.
 constexpr double kSlopeM = 90;
 
 double distance(const PlanePoint& a, const PlanePoint& b) {

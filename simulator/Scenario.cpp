@@ -33,7 +33,7 @@ void Scenario::step() {
 }
 
 void Scenario::move() {
-    constexpr double kSpeedChangeMps = 0.25; // in one step
+    constexpr double kSpeedChangeMps = 0.25; // per step
     constexpr double kStep_s = std::chrono::duration<double>(kStep).count();
     _speed_mps =
         std::clamp(_speed_mps + _random.normal() * kSpeedChangeMps, kSlowestMps, kFastestMps);
@@ -47,7 +47,7 @@ void Scenario::move() {
 }
 
 void Scenario::chooseLayer() {
-    constexpr int kLayerPatience = 6; // steps for which a threshold has to be passed
+    constexpr int kLayerPatience = 6; // steps for which a threshold must be exceeded
     _hasNewLayer = false;
     if (!_fallback || !_activity.isRegistered()) {
         return;

@@ -15,7 +15,7 @@ namespace pallax {
 
 namespace {
 
-/// So that the measurement noise has nothing to do with the scenario's chances.
+/// Makes the measurement noise independent of the scenario's random numbers.
 constexpr std::uint64_t kReportSeed = 0x5EED0FF5E7;
 
 struct SimulatedTechnology {
@@ -93,9 +93,9 @@ std::optional<Simulation::Packet> Simulation::next() {
     return Packet{time, _record};
 }
 
-/// The packets do not come like clockwork, but in order.
+/// Packets are irregular but in order.
 Time Simulation::nextTime() {
-    constexpr double kUnrest = 0.6; // of the time between two packets
+    constexpr double kUnrest = 0.6; // relative to the time between two packets
     const auto delay =
         static_cast<std::int64_t>(_reports.unit() * kUnrest * static_cast<double>(_slot.count()));
     return kStart + _slot * static_cast<std::int64_t>(_count++) + std::chrono::nanoseconds(delay);

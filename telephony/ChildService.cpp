@@ -36,7 +36,7 @@ enum Argument {
     kInterval,
     kRecording,
     kInputName,
-    kTechnology, // of a simulation, or empty; then the simulation's numbers
+    kTechnology, // for a simulation, or empty; then the simulation's numbers
     kSeed,
     kRate,
     kSeconds,
@@ -71,7 +71,7 @@ std::string readToEnd(const Descriptor& descriptor) {
     }
 }
 
-/// True when the child says that it is ready; false when it ends without.
+/// True when the child reports that it is ready; false if it ends before.
 bool waitUntilReady(const Descriptor& ready) {
     char sign = 0;
     ssize_t count = 0;
@@ -105,7 +105,7 @@ Number numberOf(const std::string& text) {
     return number;
 }
 
-/// Nothing when the arguments ask for a recording.
+/// Nothing if the arguments name a recording.
 std::optional<SimulationOptions> simulationOf(const std::vector<std::string>& arguments) {
     SimulationOptions simulation;
     simulation.technology = technologyOfCommandName(arguments[kTechnology]);
@@ -120,8 +120,8 @@ std::optional<SimulationOptions> simulationOf(const std::vector<std::string>& ar
     return simulation;
 }
 
-/// This program again. By its path, for lists of processes name it after that (and memory checkers
-/// follow it); where an update has replaced the file since, by what runs.
+/// Starts this program again: by its path, which process lists and memory checkers show; if an
+/// update has replaced the file, by the running image.
 void startAgain(char* const* arguments) {
     std::array<char, PATH_MAX> path{};
     if (::readlink("/proc/self/exe", path.data(), path.size() - 1) > 0) {
@@ -130,11 +130,11 @@ void startAgain(char* const* arguments) {
     (void)::execv("/proc/self/exe", arguments);
 }
 
-/// In the child, between fork and exec: only what is safe there, and it does not return.
-/// `input` is what it reads as standard input; below zero, nothing.
+/// In the child, between fork and exec: only uses functions that are safe there, and does not
+/// return. `input` becomes its standard input; if negative, standard input is empty.
 [[noreturn]] void becomeService(pid_t parent, char* const* arguments, int input, int ready,
                                 int complaints) {
-    // Moved out of the way first, for either may be the number that the other is to have.
+    // Moved first, because each may have the number intended for the other.
     const int readyCopy = ::fcntl(ready, F_DUPFD_CLOEXEC, kReadyDescriptor + 1);
     const int complaintsCopy = ::fcntl(complaints, F_DUPFD_CLOEXEC, kReadyDescriptor + 1);
     const int nothing = ::open("/dev/null", O_RDWR | O_CLOEXEC);
@@ -142,7 +142,8 @@ void startAgain(char* const* arguments) {
         (input == STDIN_FILENO || ::dup2(input >= 0 ? input : nothing, STDIN_FILENO) >= 0) &&
         ::dup2(nothing, STDOUT_FILENO) >= 0 && ::dup2(complaintsCopy, STDERR_FILENO) >= 0 &&
         ::dup2(readyCopy, kReadyDescriptor) >= 0;
-    // Ctrl-C at the terminal goes to its whole group; when the child ends is the viewer's to say.
+    // Ctrl-C at the terminal goes to the whole process group, but the viewer decides when the child
+    // ends.
     (void)::setpgid(0, 0);
     if (wired && ::prctl(PR_SET_PDEATHSIG, SIGTERM) == 0 && ::getppid() == parent) {
         startAgain(arguments);
@@ -169,7 +170,7 @@ void end(pid_t process) {
     (void)::waitpid(process, nullptr, 0);
 }
 
-/// Without the newline, and without the program's name before it.
+/// The complaint without its newline and the program's name.
 std::string sentenceOf(std::string complaint) {
     constexpr std::string_view kName = "pallax: ";
     if (complaint.starts_with(kName)) {
@@ -218,7 +219,7 @@ Result<std::unique_ptr<ChildService>, HostError> ChildService::start(ServiceOpti
         return HostError{
             formatText("The telephony service cannot be started: %@.", {std::strerror(errno)})};
     }
-    input.reset(); // or the stream's writer would not notice the child's end
+    input.reset(); // otherwise the stream's writer would not notice the child's end
     ready.write.reset();
     complaints.write.reset();
     std::unique_ptr<ChildService> service(
@@ -258,7 +259,7 @@ std::string ChildService::takeComplaints() {
 }
 
 int runChildService(int argc, char** argv) {
-    // Without a parent that waits there, the number would be that of a file of its own.
+    // Without a waiting parent, the descriptor would be an unrelated file.
     if (argc != kArgumentCount || ::fcntl(kReadyDescriptor, F_GETFD) < 0) {
         return 2;
     }
@@ -269,7 +270,7 @@ int runChildService(int argc, char** argv) {
     options.play.loop = arguments[kLoop] == kLooping;
     options.recording = arguments[kRecording];
     options.inputName = arguments[kInputName];
-    options.lossless = true; // its only client is the viewer that has started it
+    options.lossless = true; // its only client is the viewer that started it
     options.simulation = simulationOf(arguments);
     if (const auto interval = numberOf<std::int64_t>(arguments[kInterval]); interval > 0) {
         options.play.displayInterval = std::chrono::nanoseconds(interval);

@@ -12,7 +12,7 @@ namespace pallax {
 namespace {
 
 constexpr std::size_t kChunkSize = std::size_t{64} << 10U;
-/// Unwanted packets write nothing: so many are passed over before other blocks get their turn.
+/// Unwanted packets write nothing; after this many, other blocks get their turn.
 constexpr int kPacketsPerStep = 1000;
 
 std::chrono::nanoseconds scaled(std::chrono::nanoseconds time, double factor) {
@@ -21,7 +21,7 @@ std::chrono::nanoseconds scaled(std::chrono::nanoseconds time, double factor) {
         std::llround(std::clamp(static_cast<double>(time.count()) * factor, 0.0, kLongest)));
 }
 
-/// Within the times that a source may have, whatever a recording that is played in a loop holds.
+/// Limited to the times that a source may have, even for a recording that is played in a loop.
 Time shifted(Time time, std::chrono::nanoseconds shift) {
     const bool forward = shift > std::chrono::nanoseconds::zero();
     return std::max((forward ? std::min(time, kLatestTime - shift) : time) + shift, kEarliestTime);
@@ -40,7 +40,7 @@ void PacketPlayer::play(CodeFilter filter) {
     }
 }
 
-/// One block's worth of playing.
+/// The work of one block.
 void PacketPlayer::step() {
     for (int count = 0; count < kPacketsPerStep; ++count) {
         if (!_packet && !_sourceEnded && fetch() == Progress::Wait) {
@@ -65,7 +65,7 @@ void PacketPlayer::step() {
     flushThen(&PacketPlayer::step);
 }
 
-/// Gets the next packet, if the source has one now.
+/// Gets the next packet, if the source has one.
 PacketPlayer::Progress PacketPlayer::fetch() {
     PacketSource::Next next = _setup.source.next();
     if (next.state == PacketSource::State::Later) {
@@ -90,7 +90,7 @@ PacketPlayer::Progress PacketPlayer::fetch() {
     return Progress::Go;
 }
 
-/// Takes the next packet's stamp. A receiver that is not sent the packet is to hear of it too.
+/// Takes the next packet's stamp; a receiver is told about it even if it does not get the packet.
 void PacketPlayer::followStamp() {
     const bool isFirst = _stamps.isEmpty();
     if (!_setup.options.live) {
@@ -109,9 +109,9 @@ void PacketPlayer::followStamp() {
     }
 }
 
-/// After the source's end: begins again where that is asked for and possible.
+/// At the source's end: restarts it if that is requested and possible.
 PacketPlayer::Progress PacketPlayer::startRound() {
-    const bool empty = _newRound; // a round without packets would go round for ever
+    const bool empty = _newRound; // a round without packets would repeat forever
     _newRound = true;
     _packetNumber = 0;
     _sourceEnded = empty || !_setup.options.loop || !_setup.source.failure().empty() ||
@@ -128,7 +128,7 @@ void PacketPlayer::sendPacket() {
     _packet.reset();
 }
 
-/// Go when the wall has reached the source time; else it comes back here in time.
+/// Returns Go once the wall clock has reached the source time; otherwise schedules another step.
 PacketPlayer::Progress PacketPlayer::waitUntilDue(Time time) {
     const auto delay = wallDelayUntil(time);
     if (delay <= std::chrono::nanoseconds::zero()) {
@@ -146,7 +146,7 @@ PacketPlayer::Progress PacketPlayer::waitUntilDue(Time time) {
     return Progress::Wait;
 }
 
-/// After the last packet of all: the clock goes on to the next display tick.
+/// After the very last packet: advances the clock to the next display tick.
 void PacketPlayer::finish() {
     if (!_stamps.isEmpty()) {
         if (waitUntilDue(nextTick()) == Progress::Wait) {
@@ -189,7 +189,7 @@ void PacketPlayer::writeClock(Time time) {
     _setup.sink.write(headerOf(FrameKind::Clock, time), {});
 }
 
-/// On the packet that comes next; the time is the latest before it.
+/// About the next packet; the time is the latest before it.
 void PacketPlayer::writeRemark(const StampRemark& remark) {
     FrameHeader header = headerOf(FrameKind::Remark, std::nullopt);
     if (!_stamps.isEmpty()) {

@@ -12,19 +12,19 @@ namespace pallax {
 namespace {
 
 constexpr std::chrono::seconds kLookInterval{1};
-/// So many packets are handed on before other blocks get their turn.
+/// After this many packets, other blocks get their turn.
 constexpr int kPacketsPerBlock = 100;
 
 } // namespace
 
-/// What a source and its relay share.
+/// The state shared by a source and its relay.
 struct Relay::Feed {
     struct Item {
         Time time;
         std::shared_ptr<const ByteBuffer> data;
     };
 
-    /// Wakes the source that found nothing.
+    /// Wakes the source if it is waiting.
     void tell(MainQueue& queue) {
         if (auto callback = std::exchange(ready, {})) {
             queue.async(std::move(callback));
@@ -33,7 +33,7 @@ struct Relay::Feed {
 
     std::deque<Item> items;
     std::function<void()> ready;
-    std::function<void()> begun; // the relay hears it
+    std::function<void()> begun; // for the relay
     bool hasBegun = false;
     bool ended = false;
 };
@@ -69,7 +69,7 @@ private:
     MainQueue& _queue;
     std::string _technology;
     std::shared_ptr<Feed> _feed;
-    std::shared_ptr<const ByteBuffer> _current; // the packet that `next` gave last
+    std::shared_ptr<const ByteBuffer> _current; // the latest packet from `next`
 };
 
 Relay::Relay(Setup setup)
@@ -116,7 +116,7 @@ std::function<void()> Relay::guarded(void (Relay::*member)()) {
     };
 }
 
-/// With the first source, or when the time for it is over.
+/// Called at the first source, or when the wait for it is over.
 void Relay::begin() {
     if (std::exchange(_isWaiting, false)) {
         _heard = _setup.steadyNow();

@@ -60,7 +60,7 @@ ServedChannel::ServedChannel(std::unique_ptr<PacketSource> source, std::unique_p
 
 ServedChannel::~ServedChannel() = default;
 
-/// What is no request of ours gets no reply, as a modem would not give any.
+/// Unknown requests get no reply, as from a modem.
 std::optional<ByteBuffer> ServedChannel::answer(Bytes request) {
     const auto message = decodeMessage(request);
     if (!message) {

@@ -30,15 +30,15 @@ namespace {
 
 constexpr std::string_view kAsFastAsTakenText = "max";
 
-/// What is served: the technology, and the sources, one for each channel.
+/// The service's technology, and its sources, one for each channel.
 struct Program {
     std::string technology;
     PacketSourceFactory makeSource;
-    std::shared_ptr<Relay> relay; ///< null for what is no live stream
-    Descriptor reading{};         ///< keeps recorders from replacing the recording that is played
+    std::shared_ptr<Relay> relay; ///< null unless the source is a live stream
+    Descriptor reading{};         ///< keeps recorders from replacing the recording being played
 };
 
-/// A recording that is still being written is played all the same.
+/// A recording that is still being written is played anyway.
 Descriptor lockForReading(const std::string& path) {
     Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     (void)::flock(file.number(), LOCK_SH | LOCK_NB);
@@ -53,7 +53,7 @@ Result<std::unique_ptr<PacketSource>, HostError> takeOnce(std::unique_ptr<Packet
     return std::move(stream);
 }
 
-/// Fails at once for what no channel could play. `relayEnded` is called after a live stream's end.
+/// Fails at once if no channel could play it. `relayEnded` is called after a live stream's end.
 Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueue& queue,
                                      std::function<void(bool isOrderly)> relayEnded) {
     if (options.simulation) {
@@ -97,14 +97,14 @@ Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueu
     return program;
 }
 
-/// What may be lost, and when packets are due.
+/// The buffering and the pace of the channels.
 TelephonyServer::Setup serverSetup(const ServiceOptions& options, AsioMainQueue& queue,
                                    SocketMessagePorts& ports, const Program& program) {
     TelephonyServer::Setup setup{queue,        ports,   options.controlPortName, program.makeSource,
                                  options.play, complain};
     setup.technology = program.technology;
     if (options.relay) {
-        setup.options.speed = PlayOptions::kAsFastAsTaken; // the stream has its own pace
+        setup.options.speed = PlayOptions::kAsFastAsTaken; // the stream sets the pace
         setup.options.live = true;
     }
     const bool clientSetsPace = std::isinf(options.play.speed) && !options.relay;
@@ -114,9 +114,9 @@ TelephonyServer::Setup serverSetup(const ServiceOptions& options, AsioMainQueue&
     return setup;
 }
 
-/// Stops the queue once the clients have heard the end and gone, or read nothing for too long: a
-/// client that sees the service gone gives up what it has not yet come to. Nobody else is served,
-/// so that the next service can start as soon as a client has heard the end.
+/// Stops the queue once the clients have received the end and left, or have not read for too long:
+/// a client that loses the service drops what it has not yet processed. No new clients are served,
+/// so the next service can start as soon as a client has received the end.
 class LastWords {
 public:
     explicit LastWords(AsioMainQueue& queue) : _queue(queue) {}
@@ -137,12 +137,12 @@ public:
 
 private:
     static constexpr std::chrono::milliseconds kLook{20};
-    static constexpr std::chrono::milliseconds kPatience{2000}; // with nothing read
+    static constexpr std::chrono::milliseconds kPatience{2000}; // without any reading
     static constexpr std::chrono::milliseconds kMostPatience{30000};
 
     AsioMainQueue& _queue;
     std::unique_ptr<RepeatingTimer> _looks;
-    std::chrono::milliseconds _waited{0}; // since something was read
+    std::chrono::milliseconds _waited{0}; // since the last reading
     std::chrono::milliseconds _waitedAtAll{0};
     std::size_t _untaken = 0;
 };
@@ -150,7 +150,7 @@ private:
 int serve(const ServiceOptions& options, const std::function<void()>& ready,
           SocketDirectory directory) {
     directory.removeStaleSockets();
-    const Interruption interruption; // of complaints that nobody reads
+    const Interruption interruption; // for messages that are not read
     AsioMainQueue queue;
     SocketMessagePorts ports(queue, std::move(directory));
     LastWords lastWords(queue);
@@ -184,7 +184,7 @@ std::string speedText(double speed) {
     if (std::isinf(speed)) {
         return std::string(kAsFastAsTakenText);
     }
-    std::array<char, 32> text{}; // the shortest form that reads back the same needs 24
+    std::array<char, 32> text{}; // the shortest exact form needs up to 24
     const auto result = std::to_chars(text.data(), text.data() + text.size(), speed);
     return {text.data(), result.ptr};
 }
@@ -196,7 +196,7 @@ std::optional<double> parseSpeed(const std::string& text) {
     double speed = 0;
     const char* end = text.data() + text.size();
     const auto result = std::from_chars(text.data(), end, speed);
-    constexpr double kLeast = 1e-6; // a second in eleven days
+    constexpr double kLeast = 1e-6; // one second in eleven days
     const bool whole = result.ec == std::errc() && result.ptr == end;
     return whole && std::isfinite(speed) && speed >= kLeast ? std::optional(speed) : std::nullopt;
 }
@@ -226,7 +226,7 @@ int printServiceStatus() {
     const std::string text = statusText(*status);
     const bool isPrinted =
         std::fwrite(text.data(), 1, text.size(), stdout) == text.size() && std::fflush(stdout) == 0;
-    if (isPrinted || errno == EPIPE) { // whoever reads has seen enough
+    if (isPrinted || errno == EPIPE) { // a reader that has gone has seen enough
         return 0;
     }
     complain("Standard output cannot be written.");

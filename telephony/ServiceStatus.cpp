@@ -104,7 +104,7 @@ Result<ServiceStatus, HostError> askStatus(SocketMessagePorts& ports,
 }
 
 std::string statusText(const ServiceStatus& status) {
-    std::string technology; // as the service sends it
+    std::string technology; // as sent by the service
     appendPrintable(technology, status.technology);
     std::string text = formatText(
         "Technology: %@\nUptime: %lld s\nPackets sent: %lld\n"

@@ -32,7 +32,7 @@ void SocketSink::write(const FrameHeader& header, Bytes data) {
         if (isPacket) {
             drop();
         }
-        return; // of a time that is left out, a later one tells
+        return; // a later time replaces one that is skipped
     }
     appendFrame(_next, header, data);
     _unflushed += size;
@@ -40,7 +40,7 @@ void SocketSink::write(const FrameHeader& header, Bytes data) {
     _packets += isPacket ? 1U : 0U;
 }
 
-/// What is larger than all the room finds room alone.
+/// A packet larger than the whole buffer is accepted when the buffer is empty.
 bool SocketSink::hasRoomFor(std::size_t size) const {
     const std::size_t waiting = _chunk.size() - _chunkSent + _next.size();
     return !_setup.mostWaiting || waiting == 0 || waiting + size <= *_setup.mostWaiting;
@@ -78,7 +78,7 @@ void SocketSink::flush(std::function<void()> done) {
     }
 }
 
-/// The receiver sends nothing on this connection; what can be read is its end.
+/// The receiver sends nothing on this connection, so readable means that it has ended.
 void SocketSink::watchReceiver() {
     _watch.onceReadable([this] {
         std::array<std::uint8_t, 1> nothing{};
@@ -102,7 +102,7 @@ void SocketSink::send() {
     while (_chunkSent < _chunk.size()) {
         const Transfer transfer = sendTo(_socket, Bytes(_chunk).subspan(_chunkSent));
         if (transfer.state == Transfer::State::Closed) {
-            // The watch for reading tells it, also where only the sending has failed.
+            // The watch reports it, even if only sending has failed.
             (void)::shutdown(_socket.number(), SHUT_RDWR);
             return;
         }

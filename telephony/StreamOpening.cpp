@@ -12,7 +12,7 @@ namespace {
 
 using Clock = std::chrono::steady_clock;
 
-/// Looks on while somebody else waits.
+/// Watches the time while another thread waits.
 class Watch {
 public:
     explicit Watch(const StreamOpening& opening) : _opening(opening), _thread([this] { look(); }) {}
@@ -20,7 +20,7 @@ public:
     Watch(const Watch&) = delete;
     Watch& operator=(const Watch&) = delete;
 
-    /// The wait is over. True when it was reported.
+    /// Ends the watch. True if the wait was reported.
     bool end() {
         {
             const std::lock_guard lock(_mutex);
@@ -49,7 +49,7 @@ private:
     std::condition_variable _over;
     bool _isOver = false;
     bool _hasReported = false;
-    std::thread _thread; // the last, for it uses the others
+    std::thread _thread; // declared last, because it uses the others
 };
 
 } // namespace

@@ -9,7 +9,7 @@
 
 namespace pallax {
 
-/// What the source and its reading thread share; the last of the two frees it.
+/// The state shared by the source and its reading thread; the last user frees it.
 struct StreamSource::Shared {
     struct Item {
         Time time;
@@ -33,7 +33,7 @@ struct StreamSource::Shared {
     bool ended = false;
 };
 
-/// With the mutex held: wakes the source that found nothing.
+/// Wakes the source if it is waiting. The caller holds the mutex.
 void StreamSource::Shared::tell(const std::shared_ptr<Shared>& self) {
     if (!waiting || !wanted) {
         return;
@@ -46,7 +46,7 @@ void StreamSource::Shared::tell(const std::shared_ptr<Shared>& self) {
     });
 }
 
-/// The thread's whole work.
+/// The thread's main function.
 void StreamSource::Shared::read(Recording& recording, const std::shared_ptr<Shared>& self) {
     for (;;) {
         const auto packet = recording.next();
@@ -70,7 +70,7 @@ StreamSource::StreamSource(MainQueue& queue, std::unique_ptr<Recording> recordin
     : _technology(recording->technology()->identifier), _shared(std::make_shared<Shared>(queue)) {
     std::thread([shared = _shared, recording = std::move(recording)] {
         shared->read(*recording, shared);
-    }).detach(); // it may be waiting for input that never comes
+    }).detach(); // it may wait for input forever
 }
 
 StreamSource::~StreamSource() {

@@ -56,7 +56,7 @@ std::optional<ByteBuffer> TelephonyServer::answer(Bytes request) {
     return encodeMessage(createLogChannelReply(channel));
 }
 
-/// A channel that fed the service itself would never end.
+/// A channel that feeds the service itself would never end.
 bool TelephonyServer::isOwnPort(const std::string& name) const {
     return name == _setup.controlPortName ||
            name.starts_with(_setup.controlPortName + kChannelSuffix);

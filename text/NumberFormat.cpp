@@ -8,7 +8,7 @@ namespace pallax {
 
 namespace {
 
-// The largest double has 309 digits before its point; a precision is at most 400.
+// The largest double has 309 digits before the decimal point; a precision is at most 400.
 constexpr std::size_t kLongestNumber = 309 + 1 + 400 + 1;
 constexpr int kDefaultPrecision = 6;
 
@@ -16,12 +16,12 @@ void appendUnescaped(std::string& out, std::string_view text) {
     for (std::size_t at = 0; at < text.size(); ++at) {
         out += text[at];
         if (text[at] == '%') {
-            ++at; // "%%" stands for one per cent sign
+            ++at; // "%%" is one per cent sign
         }
     }
 }
 
-/// Sign and digits, padded to the width: zeros go between the two, blanks outside.
+/// Sign and digits, padded to the width with zeros between them or blanks outside.
 void appendPadded(std::string& out, const NumberConversion& conversion, std::string_view sign,
                   std::string_view digits, bool zeroPad) {
     const std::size_t length = sign.size() + digits.size();

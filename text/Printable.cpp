@@ -52,11 +52,11 @@ void appendCharacters(std::string& out, std::string_view text, Escaped escaped) 
     }
 }
 
-/// How many bytes at the end are the beginning of a character, as far as their leading byte tells.
+/// The number of bytes at the end that begin a character, according to its leading byte.
 std::size_t begunCharacter(std::string_view text) {
     constexpr std::size_t kMostBegun = 3;
     constexpr std::uint8_t kLastLead = 0xF4;
-    constexpr auto kLeads = std::to_array<std::uint8_t>({0xC0, 0xE0, 0xF0}); // of 2, 3 and 4 bytes
+    constexpr auto kLeads = std::to_array<std::uint8_t>({0xC0, 0xE0, 0xF0}); // for 2, 3 and 4 bytes
     for (std::size_t size = 1; size <= std::min(kMostBegun, text.size()); ++size) {
         const auto byte = static_cast<std::uint8_t>(text[text.size() - size]);
         if (byte >= kLeads.front()) {

@@ -7,7 +7,7 @@ namespace pallax {
 
 namespace {
 
-/// How a character is written that roff would take for something else; empty: as it is.
+/// The escape of a character that has a meaning in roff; empty for others.
 std::string_view nameOf(char character) {
     switch (character) {
     case '\\':
@@ -40,7 +40,7 @@ std::string roffText(std::string_view text) {
         }
         const bool lineStarts = result.empty() || result.back() == '\n';
         if (lineStarts && character == '.') {
-            result += "\\&"; // the line would be a request
+            result += "\\&"; // otherwise the line would be a request
         }
         if (const std::string_view name = nameOf(character); !name.empty()) {
             result += name;

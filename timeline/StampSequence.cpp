@@ -8,7 +8,7 @@ namespace pallax {
 
 namespace {
 
-/// From the earlier time to the later one; at most what a duration can hold.
+/// From the earlier time to the later one; limited to the range of a duration.
 std::chrono::nanoseconds distance(Time earlier, Time later) {
     const auto bits = [](Time time) {
         return static_cast<std::uint64_t>(time.time_since_epoch().count());

@@ -8,8 +8,8 @@ std::uint64_t bits(Time time) {
     return static_cast<std::uint64_t>(time.time_since_epoch().count());
 }
 
-/// How many whole intervals fit between two times, whose distance a signed number may be too small
-/// for; `to` is not earlier.
+/// The number of whole intervals between two times, whose distance may overflow a signed number;
+/// `to` must not be before `from`.
 std::uint64_t intervalsBetween(Time from, Time to, std::chrono::nanoseconds interval) {
     return (bits(to) - bits(from)) / static_cast<std::uint64_t>(interval.count());
 }

@@ -20,7 +20,7 @@ constexpr double kNoiseDb = 0.4;
 constexpr double kLeastPartDb = -15;
 constexpr std::size_t kMostPilots = 4;
 
-/// The serving pilot and others that are strong enough, with their parts of what is received.
+/// The serving pilot and other strong ones, with their shares of the received power.
 struct PilotSet {
     std::array<Pilot, kMostPilots> pilots{};
     std::size_t count = 0;
@@ -48,13 +48,13 @@ private:
     }
 };
 
-/// All that is received of a carrier is stronger than its pilots.
+/// The total received power of a carrier, above that of its pilots.
 double received_dbm(const RadioLayer& layer, Random& random) {
     constexpr double kAbovePilotsDb = 4;
     return measured(layer.total_dbm() + kAbovePilotsDb, kNoiseDb, random);
 }
 
-/// By open-loop power control: the weaker the cell, the louder the phone.
+/// Open-loop power control: the weaker the cell, the higher the power.
 double transmit_dbm(double receive_dbm) {
     constexpr double kSumOfBothDbm = -76;
     constexpr double kLeastDbm = -50;
@@ -108,14 +108,14 @@ void CdmaModem::observe(const Scenario& scenario, RecordQueue& queue) {
     }
     countTraffic(scenario);
     constexpr std::chrono::milliseconds kSecond{1000};
-    constexpr std::size_t kMostWaiting = 8; // at a rate that is too low for these counters
+    constexpr std::size_t kMostWaiting = 8; // at a rate too low for these counters
     if (scenario.now() % kSecond == std::chrono::milliseconds(0) && queue.size() < kMostWaiting) {
         cdma::encode(_forward, queue.add());
         cdma::encode(_reverse, queue.add());
     }
 }
 
-/// What the link carries in a step, and a sequence number for each second.
+/// Adds the traffic of a step, and increases the sequence number each second.
 void CdmaModem::countTraffic(const Scenario& scenario) {
     constexpr std::uint32_t kSteps = std::chrono::milliseconds(1000) / Scenario::kStep;
     const auto second = static_cast<std::uint32_t>(
@@ -152,7 +152,7 @@ void CdmaModem::report(const Scenario& scenario, Random& random, ByteBuffer& out
     case kIdentity:
         return encodeIdentity(scenario, out);
     case kFrame: {
-        // The weaker the pilot against the others, the more frames are lost.
+        // The weaker the pilot relative to the others, the more frames are lost.
         const RadioLayer& layer = scenario.layer(k1x);
         const double below_db = layer.total_dbm() - layer.campedLevel_dbm();
         return cdma::encode(cdma::TrafficFrame{random.unit() < 0.005 + 0.01 * below_db}, out);

@@ -17,7 +17,7 @@ int rawGain(double level_dbm) {
     return std::clamp(whole((level_dbm - kMiddleDbm) / kStepDb), -128, 127);
 }
 
-// The scale of the energies of the active set: 2^(2e - 3) E / (9 N^2 g) - 1/N is the part.
+// The scale of energies in the active set: the share is 2^(2e - 3) E / (9 N^2 g) - 1/N.
 constexpr unsigned kLength = 64; // N
 constexpr unsigned kGain = 1;    // g
 constexpr unsigned kExponent = 2;

@@ -8,7 +8,7 @@ namespace {
 
 constexpr unsigned kByte = 8;
 
-/// 262 42, with the digits in pairs and the low one first.
+/// 262 42, digits in pairs, low digit first.
 constexpr std::uint8_t kPlmn1 = 0x62;
 constexpr std::uint8_t kPlmn2 = 0xF2;
 constexpr std::uint8_t kPlmn3 = 0x24;
@@ -49,7 +49,7 @@ bool SimReading::isDue(const Scenario& scenario) {
     if (phase == Activity::Phase::Registering || phase == Activity::Phase::Updating) {
         _isUpdating = true;
     }
-    // Another cell may lie in an area that is still to be updated.
+    // Another cell may be in an area that is not yet updated.
     const bool settled = phase == Activity::Phase::Idle && !scenario.hasNewServingCell();
     const bool updated = settled && std::exchange(_isUpdating, false);
     return updated || scenario.now().count() == 0;

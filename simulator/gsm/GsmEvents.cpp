@@ -19,7 +19,7 @@ bool onGsm(const Scenario& scenario) {
     return scenario.servingLayer() == GsmModem::kGsm;
 }
 
-/// State and sub-state of both mobility managements, and the registration, in a phase.
+/// State and sub-state of both mobility managements, and the registration, for a phase.
 struct PhaseStates {
     ServiceState service;
     MobilityState circuit;
@@ -92,7 +92,7 @@ void queueRadioState(const Scenario& scenario, RecordQueue& queue) {
     }
 }
 
-/// The channel of a data session on GSM: it hops between the cell's frequencies.
+/// The channel of a data session on GSM, which hops between the cell's frequencies.
 void queueDedicatedChannel(const Scenario& scenario, RecordQueue& queue) {
     constexpr unsigned kHoppingDistance = 8;
     const unsigned arfcn = scenario.serving().campedCell().channel;
@@ -104,7 +104,7 @@ void queueDedicatedChannel(const Scenario& scenario, RecordQueue& queue) {
     encode(Dtx{true}, queue.add());
 }
 
-/// What a GSM cell broadcasts.
+/// The broadcast parameters of a GSM cell.
 void queueBroadcast(const Scenario& scenario, RecordQueue& queue) {
     const Cell& cell = scenario.serving().campedCell();
     encode(ServingIdentity{cell.channel, cell.code, cell.identity & 0xFFFFU}, queue.add());
@@ -160,10 +160,10 @@ void queueServingCell(const Scenario& scenario, RecordQueue& queue) {
                queue.add());
     }
     if (scenario.activity().isRegistered()) {
-        encodeServingPlmn(scenario, queue.add()); // the cell may lie in another area
+        encodeServingPlmn(scenario, queue.add()); // the cell may be in another area
     }
     if (changesLayer) {
-        if (onGsm(scenario)) { // what was left has no connection any more
+        if (onGsm(scenario)) { // the previous technology no longer has a connection
             encode(RrcState::Disconnected, queue.add());
         } else {
             encode(RrInfo{RrState::Inactive, 0, 0, true}, queue.add());

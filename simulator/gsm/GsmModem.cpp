@@ -65,14 +65,14 @@ void GsmModem::report(const Scenario& scenario, Random& random, ByteBuffer& out)
         shares[kMeasurement] = 80;
         shares[kBsics] = 24;
         shares[kDtx] = 6;
-        shares[kSearcher] = 12; // for the way back
+        shares[kSearcher] = 12; // to find the way back to UMTS
     } else if (scenario.activity().isConnected()) {
         shares[kSearcher] = 52;
         shares[kPower] = 44;
         shares[kHsdpa] = 36;
         shares[kBlocks] = 16;
     } else {
-        // Either ranking empties the other set; the GSM one comes at times.
+        // Each ranking empties the other set; the GSM one comes from time to time.
         shares[kSearcher] = 52;
         shares[kUmtsRanking] = 40;
         shares[kGsmRanking] = 8;
@@ -103,7 +103,7 @@ void GsmModem::report(const Scenario& scenario, Random& random, ByteBuffer& out)
     }
 }
 
-/// What stays the same is told again and again.
+/// Constant values are reported repeatedly.
 void GsmModem::reportNetwork(const Scenario& scenario, ByteBuffer& out) {
     const Cell& cell = scenario.serving().campedCell();
     constexpr unsigned kTurns = 3;

@@ -9,13 +9,12 @@ namespace pallax::gsm {
 
 namespace {
 
-/// Linear energies for each whole dB below full scale, each in the middle of what is read as that
-/// dB.
+/// Linear energies for each whole dB below full scale, each in the middle of its dB.
 std::uint32_t energyOf(int ecno_db) {
     static constexpr int kSteps = 23;
     static const auto energies = [] {
         constexpr double kFullScale = 524288;
-        constexpr double kHalfBand = 0.45; // of a dB, inside of the band
+        constexpr double kHalfBand = 0.45; // in dB, inside the band
         std::array<std::uint32_t, kSteps> table{};
         for (std::size_t below = 1; below < table.size(); ++below) {
             table[below] = static_cast<std::uint32_t>(

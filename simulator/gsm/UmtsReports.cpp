@@ -15,7 +15,7 @@ constexpr double kUmtsNoiseDb = 0.6;
 constexpr double kLeastEcnoDb = -20;
 constexpr std::size_t kMostCells = 6;
 
-/// Ec/No of the cells that the searcher finds, the serving one first.
+/// Ec/No of the cells that the searcher finds, the serving cell first.
 template <class Visit>
 void visitCells(const Scenario& scenario, Visit visit) {
     const RadioLayer& layer = scenario.layer(GsmModem::kUmts);
@@ -31,7 +31,7 @@ void visitCells(const Scenario& scenario, Visit visit) {
     }
 }
 
-/// The worse the cell is heard, the more blocks are lost.
+/// The weaker the cell, the more blocks are lost.
 double blockErrorRate(const Scenario& scenario) {
     const RadioLayer& layer = scenario.layer(GsmModem::kUmts);
     const double ecno = ecno_db(scenario, layer.campedLevel_dbm());
@@ -86,7 +86,7 @@ void reportUmtsRanking(const Scenario& scenario, Random& random, ByteBuffer& out
 }
 
 void reportTransmitPower(const Scenario& scenario, Random& random, ByteBuffer& out) {
-    // The weaker the cell is heard, the louder the phone is: by open-loop power control.
+    // Open-loop power control: the weaker the cell, the higher the power.
     constexpr double kSumOfBothDbm = -88;
     constexpr double kLargestDbm = 23;
     constexpr double kLeastDbm = -50;
@@ -117,8 +117,8 @@ void reportHsdpa(const Scenario& scenario, Random& random, ByteBuffer& out) {
     constexpr unsigned kSubFrames = 100;
     constexpr double kBitsPerTransmission = 11000;
     constexpr std::size_t kProcesses = 6;
-    constexpr unsigned kTurns = kSubFrames / kProcesses; // of a process; whole ones
-    // Two carriers where there is much to be had.
+    constexpr unsigned kTurns = kSubFrames / kProcesses; // of a process, rounded down
+    // Two carriers at high load.
     constexpr double kSecondCarrierLoad = 0.6;
     const double load = scenario.activity().load();
     const bool dual = load > kSecondCarrierLoad;

@@ -51,7 +51,7 @@ ifx::ServingCell servingCell(const Scenario& scenario, Random& random) {
 
 using Neighbours = std::array<ifx::NeighbourCell, ifx::Picture::kMostNeighbours>;
 
-/// The BSIC of a weak cell is not read.
+/// The BSIC of a weak cell cannot be read.
 std::size_t neighbourCells(const Scenario& scenario, Random& random, Neighbours& cells) {
     constexpr int kReadableDbm = -98;
     const RadioLayer& layer = scenario.serving();
@@ -110,7 +110,7 @@ std::optional<ifx::DedicatedChannel> dedicatedChannel(const Scenario& scenario, 
 ScenarioPlan IfxModem::plan() {
     ScenarioPlan plan;
     plan.layers = {{.firstChannel = 11,
-                    .channelStep = 3, // and the hopping stays in the band
+                    .channelStep = 3, // so that hopping stays in the band
                     .channelCount = 25,
                     .codeCount = 64,
                     .firstIdentity = 20817,
@@ -123,12 +123,12 @@ ScenarioPlan IfxModem::plan() {
     return plan;
 }
 
-/// Nothing: every message tells everything.
+/// Does nothing: every message contains everything.
 void IfxModem::observe(const Scenario& /*scenario*/, RecordQueue& /*queue*/) {}
 
 void IfxModem::report(const Scenario& scenario, Random& random, ByteBuffer& out) {
     constexpr unsigned kFormTurn = 8;
-    Neighbours neighbours; // of which only those that are heard are written
+    Neighbours neighbours; // only those that can be heard are written
     Hopping hopping{};
     ifx::Picture picture{};
     picture.isRegistered = scenario.activity().isRegistered();

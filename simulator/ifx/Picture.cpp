@@ -28,8 +28,8 @@ Word wordOf(RrState state) {
     return "Idle";
 }
 
-/// Tells a writer of one of the forms what a picture holds. The modem wraps what has a unit or a
-/// name into a dictionary of its own.
+/// Feeds the content of a picture to a writer of one of the forms. The modem wraps values with a
+/// unit or a name in a dictionary of their own.
 template <class Writer>
 class Teller {
 public:

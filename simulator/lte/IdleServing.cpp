@@ -8,7 +8,7 @@ namespace {
 
 constexpr unsigned kNoThreshold = 32;
 
-/// In steps of 2 dB, of 5 bits.
+/// In steps of 2 dB, in 5 bits.
 unsigned rawThreshold(int threshold_db) {
     return threshold_db < 0 ? kNoThreshold : rawOf(threshold_db, 0, 2, 5);
 }

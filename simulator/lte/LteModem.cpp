@@ -24,14 +24,14 @@ constexpr unsigned kResourceBlocks = 100;
 constexpr unsigned kServingPriority = 5;
 constexpr int kQrxlevminDbm = -122;
 constexpr int kLargestPowerDbm = 23;
-/// Below that much above Qrxlevmin other carriers are searched.
+/// Other carriers are searched below this level above Qrxlevmin.
 constexpr int kSearchDb = 26;
 
-/// What is measured differs so much from what is smoothed.
+/// Difference between measured and smoothed values.
 constexpr double kLevelNoiseDb = 0.5;
 constexpr double kQualityNoiseDb = 0.3;
 
-/// The part of the carrier that is the cell's: the more of the carrier is in use, the less.
+/// The cell's share of the carrier; the more of the carrier is in use, the smaller.
 double rsrq_db(const Scenario& scenario, double level_dbm) {
     constexpr double kAloneDb = -5.5;
     constexpr double kLoadDb = -3;
@@ -39,14 +39,13 @@ double rsrq_db(const Scenario& scenario, double level_dbm) {
            kLoadDb * scenario.activity().load();
 }
 
-/// The whole carrier is that much stronger than one of its tones.
+/// The whole carrier is stronger than one of its tones.
 double rssi_dbm(double level_dbm, double quality_db) {
     constexpr double kResourceBlocksDb = 20;
     return level_dbm - quality_db + kResourceBlocksDb;
 }
 
-// A cell whose part of the carrier is small is not found, and one that is found is not always
-// measured.
+// A cell with a small share of the carrier is not found, and a found one is not always measured.
 constexpr double kMeasuredBelowTotalDb = -10.5;
 constexpr double kFoundBelowTotalDb = -14;
 
@@ -102,7 +101,7 @@ void reportNeighbours(const Scenario& scenario, Random& random, ByteBuffer& out)
         const Cell& cell = layer.cells()[index];
         const double level_dbm = layer.level_dbm(index);
         const double quality_db = rsrq_db(scenario, level_dbm);
-        // Where the cell's frames begin, as heard here: the same as long as the cell is heard.
+        // The start of the cell's frames as heard here; constant while the cell is heard.
         constexpr unsigned kFrameLength = 1229;
         constexpr unsigned kSamplesPerFrame = 307200;
         cells[count++] = {cell.code,
@@ -142,7 +141,7 @@ void reportConnected(const Scenario& scenario, Random& random, ByteBuffer& out) 
             detected[detectedCount++] = layer.cells()[index].code;
         }
     }
-    // The report may come at any of a step's subframes.
+    // The report may come in any subframe of the step.
     const auto subframe =
         static_cast<unsigned>(scenario.now().count()) + random.below(Scenario::kStep.count());
     lte::encode(lte::ConnectedMeasurement{layer.campedCell().channel, subframe % kSubframes,
@@ -152,7 +151,7 @@ void reportConnected(const Scenario& scenario, Random& random, ByteBuffer& out) 
                 out);
 }
 
-/// The cell of that layer, where one is heard.
+/// The cell of that layer, if one is heard.
 std::span<const ReselectionCandidate> candidateOf(const Scenario& scenario, Layer layer,
                                                   ReselectionCandidate& candidate) {
     const RadioLayer& radio = scenario.layer(layer);

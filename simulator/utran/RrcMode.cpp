@@ -7,7 +7,7 @@ namespace pallax::utran {
 //   13    8      version
 //   14    8      mode
 void encode(RrcMode mode, ByteBuffer& out) {
-    constexpr unsigned kVersion = 1; // the only one that is understood
+    constexpr unsigned kVersion = 1; // the only known version
     RecordWriter(out, 0xD0E0).u8(kVersion).u8(static_cast<unsigned>(mode));
 }
 

@@ -21,7 +21,7 @@ constexpr unsigned kFirstUra = 3;
 constexpr unsigned kBand = 34;
 constexpr double kNoiseDb = 0.6;
 
-/// From the weakest level that is heard on, to the 256 steps of the record.
+/// From the weakest audible level, in the 256 steps of the log record.
 unsigned filteredRscp(double level_dbm) {
     constexpr double kLeastDbm = -116;
     constexpr double kStepDb = 0.3;
@@ -38,7 +38,7 @@ void encodeServing(const Scenario& scenario, ByteBuffer& out) {
 }
 
 void reportNeighbours(const Scenario& scenario, Random& random, ByteBuffer& out) {
-    constexpr std::size_t kMonitored = 5; // the strongest; others are just detected
+    constexpr std::size_t kMonitored = 5; // the strongest; others are only detected
     const RadioLayer& layer = scenario.layer(kUtran);
     std::array<utran::MeasuredCell, RadioLayer::kMostHeard + 1> cells{};
     std::size_t count = 0;
@@ -75,7 +75,7 @@ void reportGsmNeighbours(const Scenario& scenario, Random& random, ByteBuffer& o
     utran::encode(std::span<const utran::GsmNeighbour>(cells.data(), count), out);
 }
 
-/// The weaker the cell against the others, the worse the channels.
+/// The weaker the cell relative to the others, the worse the channels.
 void reportQuality(const Scenario& scenario, Random& random, ByteBuffer& out) {
     constexpr double kBestRatio = 42;
     constexpr double kMostErrors = 60;
@@ -130,7 +130,7 @@ ScenarioPlan UtranModem::plan() {
     return plan;
 }
 
-/// After each session the phone waits in another of the states that save its battery.
+/// After each session the phone waits in a different one of the states that save its battery.
 void UtranModem::choosePhaseMode(Phase phase) {
     constexpr std::array<RrcMode, 3> kWaiting = {RrcMode::Disconnected, RrcMode::Pch,
                                                  RrcMode::UraPch};
