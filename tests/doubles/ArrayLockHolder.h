@@ -8,9 +8,9 @@
 
 namespace pallax::doubles {
 
-/// Runs `work` in a thread of its own while this one holds the array lock, for up to `patience`,
-/// then `meanwhile` in this one, lets go and waits for the thread's end. True when the work was
-/// done under the held lock, so without taking it.
+/// Runs `work` in its own thread while this one holds the array lock, for up to `patience`, then
+/// runs `meanwhile` in this thread, releases the lock and joins the thread. True if the work
+/// finished while the lock was held, that is, without taking it.
 template <class Work, class Meanwhile>
 bool finishesUnderHeldArrayLock(std::chrono::milliseconds patience, const Work& work,
                                 const Meanwhile& meanwhile) {
@@ -27,9 +27,9 @@ bool finishesUnderHeldArrayLock(std::chrono::milliseconds patience, const Work& 
     return finished;
 }
 
-/// How long work gets that must wait for the lock.
+/// Time limit for work that must wait for the lock.
 inline constexpr std::chrono::milliseconds kExpectedToWait{60};
-/// How long work gets that must not: an end for a failing test, not a delay for a passing one.
+/// Time limit for work that must not wait; only a failing test uses it up.
 inline constexpr std::chrono::milliseconds kExpectedToFinish{10000};
 
 } // namespace pallax::doubles

@@ -13,16 +13,16 @@
 
 namespace pallax::doubles {
 
-/// A technology's class index, and what every such index is asked.
+/// A technology's class index, and the checks that apply to every index.
 template <class Index>
 class ClassIndexFixture : public testing::Test {
 protected:
     using Names = std::vector<std::string>;
-    /// The sections of who gets the packets of a log code, in call order.
+    /// The sections of a log code's subscribers, in call order.
     using Subscribers = std::map<LogCode, Names>;
 
-    /// Each log code of the table has exactly its subscribers, and no other code has any: the
-    /// index wants none, and `unwanted`, a code beside those of the table, finds nobody.
+    /// Each log code of the table has exactly its subscribers, and no other code has any: the index
+    /// wants no others, and `unwanted`, a code outside the table, has none.
     void expectSubscribers(const Subscribers& table, LogCode unwanted) const {
         Names codes;
         for (const auto& [logCode, names] : table) {
@@ -42,13 +42,14 @@ protected:
         return names;
     }
 
-    /// A file of resources/ against the records, both ways.
+    /// Compares a template in resources/ with the records, both ways.
     void expectTemplateMatches(const std::string& file) const {
         doubles::expectTemplateMatches(
             propertyListFile(std::string(PALLAX_SOURCE_DIR "/resources/") + file), _index);
     }
 
-    /// The lines of a new index, when its records register one after the other with so many codes.
+    /// The lines of a new index whose records register one after the other, each with this many
+    /// codes.
     static void expectRegistration(const std::vector<int>& codes) {
         FakeStandardOutput output;
         const RecordingLog log;
@@ -60,7 +61,7 @@ protected:
         EXPECT_EQ(log.lines(), lines);
     }
 
-    /// What an index prints at its end.
+    /// The lines that an index prints on destruction.
     static Names lastLines() {
         FakeStandardOutput output;
         { const Index index(output); }

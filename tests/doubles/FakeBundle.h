@@ -4,7 +4,7 @@
 
 namespace pallax::doubles {
 
-/// A bundle that says what its fields say.
+/// A bundle with public fields.
 class FakeBundle final : public Bundle {
 public:
     std::optional<std::string> bundleVersion = "1.0";

@@ -7,12 +7,12 @@
 
 namespace pallax::doubles {
 
-/// A file system in memory: the paths that were made known, and what was written.
+/// A file system in memory: known paths and written files.
 class FakeFileSystem final : public FileSystem {
 public:
     bool failWrite = false;
     std::set<std::string> present;             ///< paths that exist besides the written files
-    std::map<std::string, PropertyList> files; ///< what was written, by path
+    std::map<std::string, PropertyList> files; ///< the written values by path
 
     bool exists(const std::string& path) const override {
         return present.count(path) != 0 || files.count(path) != 0;

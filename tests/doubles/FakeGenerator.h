@@ -8,8 +8,8 @@
 
 namespace pallax::doubles {
 
-/// A generator without a modem: keeps its packets, shows what the state holds under "Display"
-/// and saves the whole state. Under the name "Fake" in `kFakeTechnologies`.
+/// A generator without a modem: keeps its packets, shows the state's "Display" and saves the whole
+/// state. Named "Fake" in `kFakeTechnologies`.
 class FakeGenerator : public LogGenerator {
 public:
     explicit FakeGenerator(const GeneratorEnvironment& environment) : LogGenerator(environment) {
@@ -23,12 +23,13 @@ public:
         return std::make_unique<FakeGenerator>(environment);
     }
 
-    /// Every fake generator there is, in the order of their making.
+    /// All living fake generators, in the order of their creation.
     inline static std::vector<FakeGenerator*> living;
 
     std::vector<ByteBuffer> packets;
-    bool refusePackets = false; ///< the next packets throw, as a malformed record does
-    PropertyList display;       ///< put into the state by the next display; null: left alone
+    bool refusePackets = false; ///< makes the following packets throw, like a malformed log record
+    PropertyList display;       ///< put into the state by the next display; if null, the state
+                                ///< keeps its own
     int displaysMade = 0;
     int caughtUp = 0;
 
@@ -53,7 +54,7 @@ public:
     }
 };
 
-/// The same, with a start command that no property list can hold. Under the name "Mute".
+/// The same, with a start command that no property list can represent. Named "Mute".
 class MuteGenerator final : public FakeGenerator {
 public:
     using FakeGenerator::FakeGenerator;

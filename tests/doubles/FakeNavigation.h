@@ -11,8 +11,8 @@
 
 namespace pallax::doubles {
 
-/// A stack that notes its calls and leads its screens through their moments: a screen is loaded
-/// and appears when it comes to the top, with a word to the delegate before.
+/// A stack that records its calls and drives its screens' life cycle: a screen is loaded and
+/// appears when it reaches the top, after the delegate has been told.
 class FakeNavigationStack final : public ui::NavigationStack {
 public:
     using ScreenRef = std::shared_ptr<ui::TableScreen>;
@@ -21,7 +21,7 @@ public:
         : _diary(diary), _screens{std::move(root)} {}
 
     ui::NavigationDelegate* delegate = nullptr;
-    std::shared_ptr<ui::ModalScreen> modal; ///< what lies over the stack, or null
+    std::shared_ptr<ui::ModalScreen> modal; ///< the screen above the stack, or null
 
     void setDelegate(ui::NavigationDelegate* newDelegate) override {
         delegate = newDelegate;
@@ -56,8 +56,7 @@ public:
         modal.reset();
     }
 
-    /// The root comes on the screen with its window: it is not navigated to, so the delegate
-    /// hears nothing.
+    /// The root appears with its window: it is not navigated to, so the delegate is not told.
     void appearWithWindow() {
         top().viewDidLoad();
         top().viewWillAppear(false);

@@ -9,8 +9,8 @@
 
 namespace pallax::doubles {
 
-/// A registry of one local and one remote port, scripted by its public fields. It notes in a diary,
-/// its own or one that it shares with other fakes, what was done to the ports, and outlives them.
+/// A registry of one local and one remote port, scripted by its public fields. It records calls on
+/// the ports in a diary, its own or one shared with other fakes, and outlives them.
 class FakePorts final : public MessagePorts {
 public:
     explicit FakePorts(std::vector<std::string>* shared = nullptr)
@@ -24,23 +24,23 @@ public:
     using Answer =
         std::function<RemoteMessagePort::Outcome(const RemoteMessagePort::Request& request)>;
 
-    bool failLocal = false;   ///< the local port cannot be made
+    bool failLocal = false;   ///< the local port cannot be created
     bool localExists = false; ///< its name is in use
     bool failRemote = false;  ///< no living port has the remote name
-    Answer answer;            ///< answers every request; without it all succeed unanswered
+    Answer answer;            ///< answers every request; without it all succeed without an answer
     std::vector<SentRequest> requests;
     std::vector<std::string>& diary; ///< "local NAME", "invalidate local", "release remote", …
 
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override;
 
-    /// A message for the local port, delivered as a block of its queue; what arrives without a
-    /// port, before it has a queue or after its end is dropped.
+    /// Delivers a message to the local port as a block of its queue; drops it if there is no port,
+    /// the port has no queue yet, or it has ended.
     void deliver(ByteBuffer data, std::int32_t identifier = 0) const;
-    /// What the receive callbacks returned so far.
+    /// The results of the receive callbacks so far.
     const std::vector<std::optional<ByteBuffer>>& replies() const { return _replies; }
 
-    /// The peer ends a port: it is invalid, and its callback is called.
+    /// The peer ends a port: the port becomes invalid and its callback is called.
     void endLocal() const;
     void endRemote() const;
 
@@ -49,7 +49,7 @@ public:
     const MessagePort* remote() const { return _remote; }
 
 private:
-    /// What both kinds of port do; `Interface` is the kind.
+    /// The common part of both kinds of port; `Interface` is the kind.
     template <class Interface>
     class Port : public Interface {
     public:
@@ -69,7 +69,7 @@ private:
         }
         bool isValid() const override { return _valid; }
 
-        /// Ends the port; the callback may destroy it, so nothing follows the call.
+        /// Ends the port; the callback may destroy it, so nothing comes after the call.
         void end() {
             if (!std::exchange(_valid, false)) {
                 return;

@@ -8,7 +8,7 @@
 
 namespace pallax::doubles {
 
-/// Preferences held in memory, with a diary of the calls in their order.
+/// Preferences in memory, with a diary of the calls.
 class FakePreferences final : public Preferences {
 public:
     bool failSynchronize = false;
@@ -27,7 +27,7 @@ public:
         diary.push_back("post " + std::string(domain) + " " + std::string(key));
     }
 
-    /// What is set in a domain.
+    /// The values of a domain.
     Dictionary domain(const std::string& name) const {
         const auto found = _domains.find(name);
         return found != _domains.end() ? found->second : Dictionary();

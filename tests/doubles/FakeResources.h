@@ -7,8 +7,7 @@
 
 namespace pallax::doubles {
 
-/// Resources held in memory: what was added under a name is its property list, and the path is
-/// "resources/NAME.plist".
+/// Resources in memory: a property list for each added name, with the path "resources/NAME.plist".
 class FakeResources final : public Resources {
 public:
     void add(const std::string& name, PropertyList object) { _objects[name] = std::move(object); }

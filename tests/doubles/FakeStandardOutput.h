@@ -7,7 +7,7 @@
 
 namespace pallax::doubles {
 
-/// Keeps the lines that were printed.
+/// Keeps the printed lines.
 class FakeStandardOutput final : public StandardOutput {
 public:
     void printLine(std::string_view line) override { lines.emplace_back(line); }

@@ -7,15 +7,15 @@
 
 namespace pallax::doubles {
 
-/// A telephony service that answers as its public fields say and keeps a diary, its own or one that
-/// it shares with other fakes.
+/// A telephony service that answers according to its public fields and keeps a diary, its own or
+/// one shared with other fakes.
 class FakeTelephony final : public TelephonyService {
 public:
     explicit FakeTelephony(std::vector<std::string>* shared = nullptr)
         : diary(shared != nullptr ? *shared : _diary) {}
 
     bool reachable = true;
-    LogChannel channel{0, 0, "modem"};   ///< what every request for a log channel gives
+    LogChannel channel{0, 0, "modem"};   ///< the answer to every request for a log channel
     std::function<void()> duringChannel; ///< called while a log channel is being created
     std::vector<std::string>& diary;     ///< "connect", "channel LOCALPORT", "release connection"
 
@@ -28,7 +28,7 @@ public:
         return std::make_unique<Connection>(*this);
     }
 
-    /// Notifies the living connection; false when there is none.
+    /// Notifies the living connection; false if there is none.
     bool notify() const {
         if (!_notification) {
             return false;

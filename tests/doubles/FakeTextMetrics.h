@@ -9,8 +9,8 @@
 
 namespace pallax::doubles {
 
-/// Text metrics of round numbers: a byte is as wide as its face says, whatever the font's size;
-/// a text whose extent a test has set has that one in every font.
+/// Text metrics with round numbers: the width of a byte depends on the face but not on the size of
+/// the font. A text with an extent set by a test has that extent in every font.
 class FakeTextMetrics final : public ui::TextMetrics {
 public:
     static constexpr double kBoldWidth = 9;

@@ -12,8 +12,8 @@
 
 namespace pallax::doubles {
 
-/// A toolkit that draws nothing. Everything that it made notes its calls in one diary, each
-/// screen and table under its number in the order of making ("screen 1", "table 1").
+/// A toolkit that draws nothing. All its objects record their calls in one diary, each screen and
+/// table by its number in the order of creation ("screen 1", "table 1").
 class FakeToolkit final : public ui::Toolkit {
 public:
     FakeTextMetrics metrics;
@@ -54,7 +54,7 @@ public:
         alerts.push_back(alert);
     }
 
-    /// What was noted since the last call.
+    /// The entries since the last call.
     ScreenDiary take() { return std::exchange(diary, {}); }
 
 private:

@@ -11,10 +11,10 @@
 
 namespace pallax::doubles {
 
-/// What was shown and asked, in order; shared by all that one toolkit has made.
+/// The calls in order, shared by all objects of one toolkit.
 using ScreenDiary = std::vector<std::string>;
 
-/// "true" or "false", as diaries have it.
+/// "true" or "false", as in diaries.
 inline std::string truth(bool value) {
     return value ? "true" : "false";
 }
@@ -26,7 +26,7 @@ inline std::string rectText(const ui::Rect& rect) {
            " " + whole(rect.size.height) + ")";
 }
 
-/// Notes what reaches the toolkit's own handling: "NAME willAppear animated=true".
+/// Records the calls of the toolkit's own handling: "NAME willAppear animated=true".
 class FakeScreenView final : public ui::ScreenView {
 public:
     FakeScreenView(ScreenDiary& diary, std::string name) : _diary(diary), _name(std::move(name)) {}
@@ -52,7 +52,7 @@ private:
     std::string _name;
 };
 
-/// A table whose rows a test asks for itself, and whose spare cells it puts there.
+/// A table whose rows the test requests and whose spare cells it provides.
 class FakeTableView final : public ui::TableView {
 public:
     FakeTableView(ScreenDiary& diary, std::string name, ui::TableSource& tableSource)
@@ -61,7 +61,7 @@ public:
     ui::TableSource& source;
     ui::Rect bounds{{0, 0}, {320, 44}};
     std::vector<std::shared_ptr<ui::TableCell>> spare; ///< cells that have left the screen
-    std::vector<std::string> dequeued;                 ///< the identifiers that were asked for
+    std::vector<std::string> dequeued;                 ///< the requested identifiers
 
     std::shared_ptr<ui::TableCell> dequeueReusableCell(std::string_view identifier) override {
         dequeued.emplace_back(identifier);
@@ -88,7 +88,7 @@ private:
     std::string _name;
 };
 
-/// A field that holds what a test types into it.
+/// A field with the text that the test types into it.
 class FakeTextField final : public ui::TextField {
 public:
     explicit FakeTextField(ScreenDiary& diary) : _diary(diary) {}

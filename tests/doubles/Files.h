@@ -6,10 +6,10 @@
 
 namespace pallax::doubles {
 
-/// The whole content of a file; nothing, with a failed expectation, where it cannot be read.
+/// The whole content of a file; empty, with a failed expectation, if it cannot be read.
 std::string contentOf(const std::filesystem::path& path);
 
-/// A fresh folder with a short path (sockets may lie in it). It goes with its content at the end.
+/// A new folder with a short path (for sockets). It is removed with its content at the end.
 class TemporaryFolder {
 public:
     TemporaryFolder();
@@ -19,7 +19,7 @@ public:
 
     std::string path() const { return _folder.string(); }
     std::string path(std::string_view name) const { return (_folder / name).string(); }
-    /// Writes a file into it; its path.
+    /// Writes a file into it and returns its path.
     std::string write(std::string_view name, std::string_view content) const;
 
 private:

@@ -8,7 +8,7 @@
 
 namespace pallax::doubles {
 
-/// Everything that a generator needs, as fakes.
+/// The dependencies of a generator, as fakes.
 struct GeneratorFixture {
     ManualClock clock;
     FakeResources resources;

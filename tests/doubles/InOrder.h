@@ -6,7 +6,7 @@
 
 namespace pallax::doubles {
 
-/// The same values in the same order of keys. Dictionaries are equal in any order.
+/// Equal values with equal order of keys. Dictionaries are equal in any order.
 inline bool sameInOrder(const Dictionary& a, const Dictionary& b) {
     return std::equal(a.begin(), a.end(), b.begin(), b.end(),
                       [](const Dictionary::Entry& one, const Dictionary::Entry& other) {

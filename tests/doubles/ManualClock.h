@@ -4,7 +4,7 @@
 
 namespace pallax::doubles {
 
-/// A clock that stands until it is moved: 2023-11-14 22:13:20 UTC at first, in the zone UTC.
+/// A clock that only tests move: initially 2023-11-14 22:13:20 UTC, in the zone UTC.
 class ManualClock final : public Clock {
 public:
     static constexpr Time kStart{std::chrono::seconds{1700000000}};

@@ -16,7 +16,7 @@
 
 namespace pallax::doubles {
 
-/// Counts what it is told.
+/// Counts its calls.
 class CountingObserver final : public ModelObserver {
 public:
     int updates = 0;
@@ -34,7 +34,7 @@ public:
     }
 };
 
-/// The timers of a queue, which are noted in a diary: "start timer", "end timer".
+/// The timers of a queue, recorded in a diary: "start timer", "end timer".
 class NotedTimers final : public TimerScheduler {
 public:
     NotedTimers(TimerScheduler& timers, std::vector<std::string>& diary)
@@ -66,8 +66,8 @@ private:
     std::vector<std::string>& _diary;
 };
 
-/// A model among fakes, whose ports, telephony service and timers share one diary. The modem
-/// answers GetTechnology as `reply` says, first with "Fake".
+/// A model with fakes; ports, telephony service and timers share one diary. The modem answers
+/// GetTechnology with `reply`, at first "Fake".
 class ModelFixture : public testing::Test {
 protected:
     using Lines = std::vector<RecordingLog::Line>;
@@ -91,8 +91,8 @@ protected:
     }
 
     void start() { model->startMonitor(); }
-    /// The texts that were logged since the last call, all of priority 3; "Creating Log object"
-    /// (of the generator itself) is left out.
+    /// The texts logged since the last call, all of priority 3; omits "Creating Log object" (by the
+    /// generator itself).
     Diary errors() {
         Diary texts;
         for (const RecordingLog::Line& line : log.take()) {
@@ -114,7 +114,7 @@ protected:
     }
     static FakeGenerator& generator() { return *FakeGenerator::living.back(); }
 
-    /// True when a start is tried after exactly 5 seconds and not a nanosecond earlier.
+    /// True if a start is tried after exactly 5 seconds and not a nanosecond earlier.
     bool retriesAfter5Seconds() {
         using namespace std::chrono_literals;
         const std::size_t before = starts();
@@ -123,7 +123,7 @@ protected:
         queue.advance(1ns);
         return !early && starts() == before + 1;
     }
-    /// How often local ports were asked for.
+    /// How often local ports were requested.
     std::size_t starts() const {
         return static_cast<std::size_t>(
             std::count(linkDiary.begin(), linkDiary.end(),

@@ -15,7 +15,7 @@
 
 namespace pallax::doubles {
 
-/// Runs the queue's blocks until the condition holds; false after ten seconds.
+/// Runs the queue's blocks until the condition is true; false after ten seconds.
 inline bool runUntil(AsioMainQueue& queue, const std::function<bool()>& condition) {
     const auto deadline = std::chrono::steady_clock::now() + std::chrono::seconds(10);
     while (!condition()) {
@@ -36,7 +36,7 @@ inline SocketDirectory openDirectory() {
     return std::move(directory).value();
 }
 
-/// A queue that runs on a thread of its own, as another process would.
+/// A queue on its own thread, in place of another process.
 class OtherProcess {
 public:
     OtherProcess() : _thread([this] { queue.run(); }) {}
@@ -56,7 +56,7 @@ private:
     std::thread _thread;
 };
 
-/// A fresh socket folder, and the ports of this process in it.
+/// A new socket folder, and the ports of this process in it.
 class PortTest : public testing::Test {
 protected:
     static ByteBuffer bytesOf(std::string_view text) { return {text.begin(), text.end()}; }

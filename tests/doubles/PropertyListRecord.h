@@ -9,7 +9,7 @@
 
 namespace pallax::doubles {
 
-/// A record that carries a property list behind its header, in the binary form.
+/// A log record with a property list after its header, in the binary form.
 inline Record propertyListRecord(LogCode logCode, const PropertyList& object) {
     const auto bytes = serializeBinary(object);
     EXPECT_TRUE(bytes) << object.description();
@@ -17,7 +17,7 @@ inline Record propertyListRecord(LogCode logCode, const PropertyList& object) {
     return bytes ? record.append(Bytes(*bytes)) : record;
 }
 
-/// A record that carries a text behind its header: a property list in the XML or the text form.
+/// A log record with a text after its header: a property list in the XML or the text form.
 inline Record textRecord(LogCode logCode, std::string_view text) {
     return Record(logCode).append(ByteBuffer(text.begin(), text.end()));
 }

@@ -10,10 +10,11 @@
 
 namespace pallax::doubles {
 
-/// Builds a log record byte by byte behind its header; multi-byte numbers are little-endian.
+/// Builds a log record byte by byte after its header; multi-byte numbers are little-endian.
 class Record {
 public:
-    /// The header of a record of that effective code: log type 1, or 0xFF for an extended one.
+    /// The header of a log record with this effective code: log type 1, or 0xFF for an extended
+    /// one.
     explicit Record(LogCode logCode) : _bytes(LogRecord::kHeaderLength) {
         constexpr std::size_t kCodeOffset = 3;
         const bool extended = logCode >= kExtendedLogCodes;
@@ -38,12 +39,12 @@ public:
         }
         return *this;
     }
-    /// Zeros up to offset `end`, counted from byte 0 of the record.
+    /// Zeros up to offset `end`, counted from byte 0 of the log record.
     Record& padTo(std::size_t end) {
         _bytes.resize(end > _bytes.size() ? end : _bytes.size());
         return *this;
     }
-    /// Sets one byte at an offset from byte 0 of the record, growing it where needed.
+    /// Sets one byte at an offset from byte 0 of the log record, which grows if necessary.
     Record& at(std::size_t offset, unsigned value) {
         padTo(offset + 1);
         _bytes[offset] = static_cast<std::uint8_t>(value);
@@ -51,7 +52,7 @@ public:
     }
 
     const ByteBuffer& bytes() const { return _bytes; }
-    /// As the log channel delivers it, behind the 2-byte transport prefix.
+    /// As the log channel delivers it, after the 2-byte transport prefix.
     ByteBuffer prefixed() const {
         ByteBuffer message(2 + _bytes.size());
         message[0] = 0x81;

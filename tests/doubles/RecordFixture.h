@@ -11,14 +11,14 @@
 
 namespace pallax::doubles {
 
-/// A section of its own for a record class, which is fed with records and read back.
+/// A section for a record class, which is fed with log records and read back.
 class SectionFixture {
 public:
     virtual ~SectionFixture() = default;
     SectionFixture(const SectionFixture&) = delete;
     SectionFixture& operator=(const SectionFixture&) = delete;
 
-    /// Feeds a record under the code in its header; the lines that it logs are kept.
+    /// Feeds a log record under the code in its header and keeps the lines that it logs.
     void feed(const ByteBuffer& bytes);
     void feed(const Record& record);
     void feed(const ByteBuffer& bytes, LogCode logCode);
@@ -26,14 +26,14 @@ public:
     Dictionary& keys() { return *_section.dictionary(); }
     Array& list() { return *_section.array(); }
     const PropertyList& section() const { return _section; }
-    /// The section as it is now, detached from later changes.
+    /// A copy of the section, detached from later changes.
     PropertyList snapshot() const;
-    /// The text under a key; "(absent)" without it.
+    /// The text under a key; "(absent)" if missing.
     std::string text(std::string_view key);
-    /// The codes that the record class wants, in its order.
+    /// The codes of the record class, in its order.
     std::vector<LogCode> subscriptions() const;
 
-    /// What the last record logged.
+    /// The lines of the last log record.
     std::vector<RecordingLog::Line> lines;
 
 protected:
@@ -69,9 +69,9 @@ PropertyList sectionAfter(const Record& record) {
     return fixture.section();
 }
 
-/// Feeds a record cut at every length below `minimum` to a fixture and asserts that its section
-/// stays as it was, then cut at every further length, which must neither throw nor read outside
-/// (each cut is a buffer of its own, so that a sanitizer sees it).
+/// Feeds a log record cut at every length below `minimum` to a fixture and asserts that its section
+/// does not change, then cut at every further length, which must neither throw nor read outside
+/// (each cut is a separate buffer, so that a sanitizer detects that).
 void cutAtEveryLength(SectionFixture& fixture, const Record& record, std::size_t minimum);
 
 template <class RecordClass>
@@ -80,7 +80,7 @@ void cutAtEveryLength(const Record& record, std::size_t minimum) {
     cutAtEveryLength(fixture, record, minimum);
 }
 
-/// Compares dictionaries with their order, printing both on failure.
+/// Compares dictionaries including their order; prints both on failure.
 void expectInOrder(const PropertyList& actual, const Dictionary& expected);
 
 } // namespace pallax::doubles

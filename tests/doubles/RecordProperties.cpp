@@ -123,7 +123,7 @@ void checkKeepsWithin(const std::set<std::string>& keys, const std::vector<LogCo
                 RC_CLASSIFY(true, "thrown");
             }
             RC_ASSERT(keepsWithin(record.fixture->section(), keys));
-            (void)record.fixture->section().description(); // makes every text once
+            (void)record.fixture->section().description(); // formats every text once
         }
     }));
 }

@@ -9,45 +9,45 @@
 #include <string>
 #include <vector>
 
-/// What holds for every record class, whatever arrives.
+/// Properties of every record class, for any input.
 namespace pallax::doubles {
 
 /// The `Thrown` of a record class that throws nothing.
 struct NothingThrown {};
 
-/// True when the keys of the section, or those of each dictionary in a list, are among `keys`.
+/// True if the keys of the section, or those of each dictionary in a list, are among `keys`.
 bool keepsWithin(const PropertyList& section, const std::set<std::string>& keys);
 
 namespace any {
 
 /// Any bytes up to a length that holds every field and a good number of list entries. In half of
-/// the cases they are small numbers, so that a count is one that the length can hold, and an entry
-/// of a kind that is shown.
+/// the cases they are small numbers, so that the length can hold the count of entries and the
+/// entries are of a kind that is shown.
 ByteBuffer recordBytes();
 
-/// A property list of any type; containers down to `depth`, whose dictionary keys are among `keys`.
+/// A property list of any type, nested at most `depth` deep, with dictionary keys from `keys`.
 PropertyList propertyList(const std::vector<std::string>& keys, int depth = 2);
 
-/// A cell with some of the cell-monitor keys, under which stands what may or may not belong there.
+/// A cell with some of the cell-monitor keys and values that may or may not be valid.
 PropertyList cell();
 
 } // namespace any
 
-/// The bytes of a record, drawn for a log code.
+/// The bytes of a log record, drawn for a log code.
 using MakeBytes = std::function<ByteBuffer(LogCode)>;
 
-/// A fixture, and how it is fed: true when the record threw what it may throw.
+/// A fixture and its feeding function, which returns true if the record threw an allowed exception.
 struct FedRecord {
     std::unique_ptr<SectionFixture> fixture;
     std::function<bool(const ByteBuffer&, LogCode)> feedThrows;
 };
 
-/// Feeds what `fresh` gives a few times with what `makeBytes` gives under any of `codes`; the keys
-/// of the section must stay within `keys`.
+/// Feeds the result of `fresh` several times with the results of `makeBytes` for any of `codes`;
+/// the keys of the section must stay within `keys`.
 void checkKeepsWithin(const std::set<std::string>& keys, const std::vector<LogCode>& codes,
                       const MakeBytes& makeBytes, const std::function<FedRecord()>& fresh);
 
-/// The same for a fresh record of a class, which may throw nothing but `Thrown`.
+/// The same for a new record of a class, which may throw nothing but `Thrown`.
 template <class RecordClass, class Thrown>
 void anyRecordsKeepWithin(const std::set<std::string>& keys, const std::vector<LogCode>& codes,
                           const MakeBytes& makeBytes) {
@@ -73,7 +73,7 @@ std::vector<LogCode> codesOf() {
     return {codes.begin(), codes.end()};
 }
 
-/// Any bytes of any length under any of the codes: those of the record class where none are given.
+/// Any bytes of any length under any of the codes; by default, those of the record class.
 template <class RecordClass, class Thrown = NothingThrown>
 void anyBytesKeepWithin(const std::set<std::string>& keys,
                         const std::vector<LogCode>& codes = codesOf<RecordClass>()) {
@@ -81,10 +81,11 @@ void anyBytesKeepWithin(const std::set<std::string>& keys,
                                               [](LogCode) { return any::recordBytes(); });
 }
 
-/// The record with any cell-monitor array under the code of that; any bytes under another.
+/// The log record with any cell-monitor array for that code; any bytes for another.
 ByteBuffer anyCellsRecord(LogCode code);
 
-/// Any cell-monitor array to a record class that subscribes to it, and any bytes under its others.
+/// Any cell-monitor array for a record class that subscribes to it, and any bytes for its other
+/// codes.
 template <class RecordClass>
 void anyCellsKeepWithin(const std::set<std::string>& keys) {
     anyRecordsKeepWithin<RecordClass, NothingThrown>(keys, codesOf<RecordClass>(), anyCellsRecord);

@@ -31,7 +31,7 @@ public:
     }
 
     const std::vector<Line>& lines() const { return _lines; }
-    /// The lines so far, which are forgotten.
+    /// Returns the lines so far and clears them.
     std::vector<Line> take() { return std::exchange(_lines, {}); }
 
 private:

@@ -23,7 +23,7 @@ public:
     std::string write(std::string_view name, std::string_view content) const {
         return _folder.write(name, content);
     }
-    /// How many sockets lie in it now.
+    /// The current number of sockets in it.
     std::size_t socketCount() const {
         std::size_t count = 0;
         for (const auto& entry : std::filesystem::recursive_directory_iterator(path())) {

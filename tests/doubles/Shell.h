@@ -9,10 +9,10 @@ struct CommandRun {
     std::string out; ///< standard output and error
 };
 
-/// Runs a command as sh takes it.
+/// Runs a command with sh.
 CommandRun runCommand(const std::string& command);
 
-/// True where a program of that name can be started.
+/// True if a program with this name can be started.
 bool isInstalled(const std::string& program);
 
 } // namespace pallax::doubles

@@ -9,9 +9,9 @@
 
 namespace pallax::doubles {
 
-/// The main queue and its timers on a time of their own, which only `advance` moves. Blocks run
-/// in the order in which they fall due, then in the order in which they were posted. An
-/// exception of a block leaves through the call that ran it; the block is gone then.
+/// The main queue and its timers with their own time, which only `advance` moves. Blocks run in the
+/// order in which they fall due, then in the order in which they were posted. An exception of a
+/// block propagates through the call that ran it; the block is then gone.
 class SteppedQueue final : public MainQueue, public TimerScheduler {
 public:
     using Duration = std::chrono::nanoseconds;
@@ -27,7 +27,7 @@ public:
         return std::make_unique<Timer>(std::move(state));
     }
 
-    /// Runs the next block that is due; false when there is none.
+    /// Runs the next due block; false if there is none.
     bool step() {
         if (_blocks.empty() || _blocks.begin()->first.first > _now) {
             return false;
@@ -37,13 +37,13 @@ public:
         return true;
     }
 
-    /// Runs blocks until none is due, those too that are posted meanwhile.
+    /// Runs blocks until none is due, including those posted in the meantime.
     void runReady() {
         while (step()) {
         }
     }
 
-    /// Moves the time on; whatever falls due runs at its own time.
+    /// Advances the time; due blocks run at their own time.
     void advance(Duration duration) {
         const Duration end = _now + duration;
         runReady();
@@ -54,7 +54,7 @@ public:
         _now = end;
     }
 
-    /// What has passed since the queue was made.
+    /// The time since the queue was created.
     Duration now() const { return _now; }
 
 private:

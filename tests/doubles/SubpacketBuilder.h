@@ -7,7 +7,7 @@
 
 namespace pallax::doubles {
 
-/// A subpacket byte by byte behind its id and size; multi-byte numbers are little-endian.
+/// Builds a subpacket byte by byte after its id and size; multi-byte numbers are little-endian.
 class Subpacket {
 public:
     explicit Subpacket(unsigned id) : _bytes({static_cast<std::uint8_t>(id), 0, 0, 0}) {}
@@ -24,14 +24,14 @@ public:
         _bytes.resize(end > _bytes.size() ? end : _bytes.size());
         return *this;
     }
-    /// Sets a 16-bit number at an offset from the subpacket's start, growing it where needed.
+    /// Sets a 16-bit number at an offset from the subpacket's start, which grows if necessary.
     Subpacket& putU16(std::size_t offset, unsigned value) {
         padTo(offset + 2);
         _bytes[offset] = static_cast<std::uint8_t>(value);
         _bytes[offset + 1] = static_cast<std::uint8_t>(value >> 8U);
         return *this;
     }
-    /// Says another size than its own from now on.
+    /// Claims another size than its own from now on.
     Subpacket& claim(unsigned size) {
         _claimed = size;
         _claims = true;
@@ -52,7 +52,7 @@ private:
     bool _claims = false;
 };
 
-/// A packet that is made of these subpackets.
+/// A packet with these subpackets.
 inline Record packetOf(LogCode logCode, const std::vector<Subpacket>& subpackets) {
     Record record(logCode);
     record.u8(0).u8(static_cast<unsigned>(subpackets.size())).padTo(17);

@@ -11,7 +11,8 @@
 
 namespace pallax::doubles {
 
-/// The property list in a file of the source tree; null, with a failed expectation, without one.
+/// The property list in a file of the source tree; null, with a failed expectation, if there is
+/// none.
 inline PropertyList propertyListFile(const std::string& path) {
     const std::string content = contentOf(path);
     const PropertyListResult parsed = parsePropertyList(ByteBuffer(content.begin(), content.end()));
@@ -29,8 +30,8 @@ inline void collectKeys(const PropertyList& object, std::map<std::string, Proper
     }
 }
 
-/// Holds a template and a class index against each other: every record has its section, of the
-/// kind that it needs and empty at the start, and every section has its record.
+/// Compares a template with a class index: every record has its section, of the right kind and
+/// empty at the start, and every section has its record.
 inline void expectTemplateMatches(const PropertyList& templateObject, const ClassIndex& index) {
     std::map<std::string, PropertyList> keys;
     collectKeys(templateObject, keys);
