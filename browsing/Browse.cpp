@@ -28,15 +28,16 @@ namespace pallax {
 
 namespace {
 
-/// Ends the child, and says what it had to complain of; true when that was nothing.
+/// Ends the child and prints its messages; true if there were none.
 bool endChild(ChildService& child) {
     child.stop();
-    const std::string complaints = child.takeComplaints(); // lines that name the program
+    const std::string complaints = child.takeComplaints(); // lines that start with the program's
+                                                           // name
     passOnComplaints(complaints);
     return complaints.empty();
 }
 
-/// What the command line and the settings file ask for.
+/// The requests of the command line and the settings file.
 struct Request {
     const BrowseOptions& options;
     const Settings& settings;
@@ -55,7 +56,7 @@ BrowsedSource sourceOf(const BrowseOptions& options) {
             RecordingFile::isStream(*options.recording)};
 }
 
-/// False when the child (null where the machine's own service is asked) ended too early.
+/// False if the child (null for the machine's own service) ended too early.
 bool browseInPrint(const Request& request, SocketDirectory directory, ChildService* child) {
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     bool isWhole = false;
@@ -65,7 +66,7 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
                              sourceOf(request.options).name);
         isWhole = browser.run();
     } catch (const FatalRecord&) {
-        output.flush(); // what was printed, and the generators' last words
+        output.flush(); // the printed text and the generators' notices
         throw;
     }
     output.flush();
@@ -73,7 +74,7 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
 }
 
 /// Restores the terminal when a signal ends the program while the main queue does not handle
-/// signals: before the queue starts and after it has gone.
+/// signals: before it starts and after it is destroyed.
 class GuardedTerminal {
 public:
     GuardedTerminal() { terminal::TerminalRestorer::guardEndings(); }
@@ -82,7 +83,7 @@ public:
     GuardedTerminal& operator=(const GuardedTerminal&) = delete;
 };
 
-/// As `browseInPrint`. The terminal is restored by the time anything else is told.
+/// Like `browseInPrint`. The terminal is restored before anything else is printed.
 bool browseOnScreen(const Request& request, SocketDirectory directory, ChildService* child) {
     KeptNotices notices(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     auto terminal = terminal::CursesTerminal::open({request.options.color, request.options.mouse});
@@ -117,21 +118,21 @@ ExitStatus browse(const Request& request, SocketDirectory directory, ChildServic
     return isWhole && isContented ? kExitSuccess : kExitFailure;
 }
 
-/// Why the recording cannot be browsed although it can be read; nothing when it can, or when only
-/// its reader will find out (a stream is read once).
+/// Why the recording cannot be browsed although it can be read; nothing if it can, or if only its
+/// reader can tell (a stream is read once).
 std::optional<std::string> refusalOf(const std::string& path) {
     if (RecordingFile::isStream(path)) {
         return std::nullopt;
     }
     const Recording::OpenResult recording = Recording::open(path);
     if (!recording) {
-        return std::nullopt; // the child service has the sentence, as for a foreign link type
+        return std::nullopt; // the child service reports it, as for an unknown link type
     }
     return missingGenerator(**recording, technologies());
 }
 
-/// The service that serves what is asked for. A stream by name is opened here, whose standard error
-/// tells where it is waited for, and is the child's standard input.
+/// Starts the requested service. A named stream is opened here, where waiting for it can be
+/// reported, and becomes the child's standard input.
 Result<std::unique_ptr<ChildService>, HostError> startChild(const BrowseOptions& options) {
     ServiceOptions service;
     service.recording = options.recording.value_or("");

@@ -8,12 +8,12 @@
 
 namespace pallax {
 
-/// Keeps the notices that generators print when they end, for standard output is the screen that is
-/// being drawn, and writes them at its own end.
+/// Keeps the notices that generators print on destruction while the screen uses standard output,
+/// and writes them in its destructor.
 class KeptNotices final : public StandardOutput {
 public:
     explicit KeptNotices(Output::Write write) : _write(std::move(write)) {}
-    /// To come when the terminal is restored. One that has gone misses the notices.
+    /// Must run after the terminal is restored. Later notices are lost.
     ~KeptNotices() override;
     KeptNotices(const KeptNotices&) = delete;
     KeptNotices& operator=(const KeptNotices&) = delete;

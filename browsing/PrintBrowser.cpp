@@ -44,7 +44,7 @@ bool PrintBrowser::run() {
         complain(stampSentence(_source, packet, remark));
     });
     if (_link.hasChild()) {
-        // The last tick has posted its view update before; that is to come first.
+        // The last tick has already posted its view update, which must run first.
         _link.clock().onEnd([&queue] { queue.async([&queue] { queue.stop(); }); });
     }
     queue.async([this] { start(); });
@@ -89,7 +89,7 @@ void PrintBrowser::generatorChosen(const std::string& /*technology*/, bool keeps
 void PrintBrowser::look() {
     _printer.showConnection(_model->isConnected());
     if (_link.childHasEnded()) {
-        // A signal to the whole process group may be on its way to us too.
+        // This process may also receive a signal that was sent to the whole process group.
         _link.queue().after(BrowseLink::kLookInterval, [this] {
             _childLost = true;
             _link.queue().stop();

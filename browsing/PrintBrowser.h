@@ -14,23 +14,23 @@ namespace pallax {
 
 class Output;
 
-/// Browses without a terminal: a model, and the printer that shows it.
+/// Browses without a terminal: a model and its printer.
 class PrintBrowser final : private ModelObserver {
 public:
-    /// `source` names what is browsed, for sentences about it.
+    /// `source` names the source in messages.
     PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
                  AfterReconnect afterReconnect, Output& output, std::string source);
-    /// Whatever ended it: switches the home-screen preference off, as the application does.
+    /// Switches the home-screen preference off, as the application does, however browsing ended.
     ~PrintBrowser() override;
     PrintBrowser(const PrintBrowser&) = delete;
     PrintBrowser& operator=(const PrintBrowser&) = delete;
 
-    /// Browses until a signal, or with a child until its recording has ended. False when the
-    /// child ended before.
+    /// Browses until a signal, or with a child until its recording has ended. False if the child
+    /// ended before.
     bool run();
 
 private:
-    /// What generators print when they end goes where the tree goes.
+    /// Prints the generators' notices to the same output as the tree.
     class Notices final : public StandardOutput {
     public:
         explicit Notices(Output& output) : _output(output) {}

@@ -16,15 +16,15 @@ struct Settings;
 /// A session on the terminal that the process runs in: its keys, its screen, and the signals.
 class ScreenBrowser {
 public:
-    /// Terminal and notices outlive the browser: errors and notices are printed once the terminal
-    /// is restored.
+    /// Terminal and notices must outlive the browser: errors and notices are printed once the
+    /// terminal is restored.
     ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
                   BrowsedSource source, const Settings& settings,
                   terminal::CursesTerminal& terminal, StandardOutput& notices);
     ScreenBrowser(const ScreenBrowser&) = delete;
     ScreenBrowser& operator=(const ScreenBrowser&) = delete;
 
-    /// Until the user quits or a signal ends it. False when the child ended before.
+    /// Runs until the user quits or a signal ends it. False if the child ended before.
     bool run();
 
 private:

@@ -58,7 +58,7 @@ void TreePrinter::printLeaf(const PallaxModelNode& leaf, std::string path, std::
     std::string value;
     (void)leaf.value()->appendString(value);
     while (values.contains(path)) {
-        path += '/'; // no child's path ends so: another leaf of the same path
+        path += '/'; // unique: no child's path ends with it; for another leaf at the same path
     }
     const auto before = _values.find(path);
     const bool changed = _hasPrinted && (before == _values.end() || before->second != value);

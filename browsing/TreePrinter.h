@@ -13,31 +13,31 @@ namespace pallax {
 
 class Clock;
 
-/// Browsing without a terminal: at each display tick that saw new data the whole tree as text,
-/// one leaf a line, the changed ones marked.
+/// Browsing without a terminal: at each display tick with new data, prints the whole tree as text,
+/// one leaf per line, and marks the changed ones.
 ///
 ///     == 2023-11-14 22:13:22 +0000
 ///     Serving Cell Measurements
 ///       E-ARFCN: 1850
 ///     * Measured RSRP: -94.75 dBm
 ///
-/// The mark takes the place of the first two blanks, so columns stay. A leaf that was not there
-/// before is a changed one; in the first block nothing is marked.
+/// The mark replaces the first two blanks, so columns stay. A new leaf counts as changed; in the
+/// first block nothing is marked.
 class TreePrinter final : public ModelObserver {
 public:
-    /// Gives the root of the display tree, or null.
+    /// Returns the root of the display tree, or null.
     using Nodes = std::function<NodeRef()>;
 
     TreePrinter(Output& output, const Clock& clock, Nodes nodes)
         : _output(output), _clock(clock), _nodes(std::move(nodes)) {}
 
     void updateViewControllerFromModel() override;
-    /// The next block is a first one.
+    /// Treats the next block as a first one.
     void startAfresh() {
         _hasPrinted = false;
         _values.clear();
     }
-    /// To be told now and then: prints "Connecting..." once each time there is no connection.
+    /// Call this regularly: prints "Connecting..." once each time the connection is lost.
     void showConnection(bool isConnected);
 
 private:

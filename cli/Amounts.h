@@ -13,7 +13,7 @@ namespace pallax {
 /// wrong with it.
 Result<std::uint64_t, std::string> parseSize(const std::string& text);
 
-/// "0.5", "3600": above 0 and up to 1000000000; else what is wrong with it.
+/// "0.5", "3600": above 0 and up to 1000000000; otherwise an error.
 Result<std::chrono::nanoseconds, std::string> parseSeconds(const std::string& text);
 
 } // namespace pallax

@@ -39,7 +39,7 @@ std::string joined(const std::vector<std::string>& words) {
     return text;
 }
 
-/// What is offered as an option's value, as assignments.
+/// The completions of an option's value, as assignments.
 std::string offerOf(const OptionDescription& option) {
     std::string offer;
     const std::string words = joined(option.choices());

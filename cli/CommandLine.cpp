@@ -48,7 +48,7 @@ ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
     return wrongUsage(error.what(), commands.empty() ? "" : commands.front()->get_name());
 }
 
-/// Why the recording cannot be begun again although that is asked for; empty otherwise.
+/// Why the recording cannot be restarted, if that is requested; otherwise empty.
 std::string loopRefusal(const std::string& recording, const PlayOptions& play) {
     if (!play.loop || !RecordingFile::isStream(recording)) {
         return {};
@@ -57,14 +57,14 @@ std::string loopRefusal(const std::string& recording, const PlayOptions& play) {
     return name + " can be played only once, not with --loop";
 }
 
-/// The help and version flags that every command has.
+/// Adds the help and version flags of every command.
 void prepare(CLI::App& app) {
     app.formatter(std::make_shared<HelpFormatter>());
     app.set_help_flag("-h,--help", "Show this help and exit");
     app.set_version_flag("--version", kVersionText, "Show the version and exit");
 }
 
-/// A required argument that is one of some names, each standing for itself.
+/// Adds a required argument with a fixed list of names.
 void addName(CLI::App& app, const std::string& argument, std::string& value,
              const std::vector<std::string>& names, const std::string& description) {
     std::vector<std::pair<std::string, std::string>> choices;
@@ -137,7 +137,7 @@ ParsedOptions CommandLine::parse(std::vector<std::string> arguments) {
     if (const std::string meant = mistypedCommand(first); !meant.empty()) {
         return wrongUsage("\"" + first + "\" is neither a command nor a recording" + meant);
     }
-    std::reverse(arguments.begin(), arguments.end()); // as CLI11 takes them
+    std::reverse(arguments.begin(), arguments.end()); // the order that CLI11 takes
     try {
         _app->parse(arguments);
     } catch (const CLI::ParseError& error) {

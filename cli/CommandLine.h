@@ -10,8 +10,8 @@
 
 namespace pallax {
 
-/// The whole command line: every command with its options, descriptions and choices, defined in
-/// one place, for parsing, help, completion and manual pages alike.
+/// The whole command line: every command with its options, descriptions and choices, defined once
+/// for parsing, help, completion and manual pages.
 class CommandLine {
 public:
     CommandLine();
@@ -19,16 +19,16 @@ public:
     CommandLine(const CommandLine&) = delete;
     CommandLine& operator=(const CommandLine&) = delete;
 
-    /// Once; `arguments` are those after the program's name.
+    /// Call this once, with the arguments after the program's name.
     ParsedOptions parse(std::vector<std::string> arguments);
 
     CommandDescription description() const;
 
 private:
     CLI::App& addCommand(const char* name, const char* description);
-    /// Those that write what packages install; the help does not show them.
+    /// Adds the commands that write the files of packages; the help does not list them.
     void addTexts();
-    /// A first word that is nearly a command's name, where no recording has that name.
+    /// The command that a first word misspells, unless a recording has that name.
     std::string mistypedCommand(const std::string& first) const;
     ParsedOptions chosen() const;
 
@@ -39,8 +39,8 @@ private:
     RecordOptions _record;
     ServiceRequest _service;
     SimulateOptions _simulate;
-    std::string _shell; ///< whose completion is asked for
-    std::string _page;  ///< the manual page that is asked for
+    std::string _shell; ///< for its completion script
+    std::string _page;  ///< the requested manual page
 };
 
 } // namespace pallax

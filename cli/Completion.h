@@ -8,11 +8,11 @@
 
 namespace pallax {
 
-/// The shells that there is a completion script for.
+/// The shells with a completion script.
 std::vector<std::string> completionShells();
 
-/// The script that makes a shell complete the program's command line: commands, options, their
-/// choices, and files where a file is taken. Empty for a shell that is unknown.
+/// The script with which a shell completes the program's command line: commands, options, their
+/// choices, and files. Empty for an unknown shell.
 std::string completionScript(const CommandDescription& program, std::string_view shell);
 
 std::string bashCompletion(const CommandDescription& program);

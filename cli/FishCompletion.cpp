@@ -25,7 +25,7 @@ std::string choicesOf(const OptionDescription& option) {
     return choices.empty() ? "" : " -a " + shellQuoted(choices);
 }
 
-/// The lines for one command's options and arguments, which hold under `condition`.
+/// The lines for one command's options and arguments, which apply under `condition`.
 std::string linesOf(const CommandDescription& command, const std::string& condition) {
     const std::string begin = "complete -c pallax -n " + shellQuoted(condition);
     std::string lines;

@@ -12,7 +12,7 @@ constexpr std::size_t kColumns = 80;
 constexpr std::size_t kDescriptionColumn = 30;
 constexpr std::size_t kIndentation = 2;
 
-/// A name and, from the description's column on, its description; a long name has a line alone.
+/// A name and its description in the description's column; a long name is on its own line.
 std::string entry(const std::string& name, const std::string& description) {
     std::string text = std::string(kIndentation, ' ') + name;
     std::size_t column = text.size();

@@ -6,8 +6,8 @@
 
 namespace pallax {
 
-/// Help pages: what the command is for, how it is called, examples, then every argument, option
-/// and command, notes and exit statuses. Descriptions are wrapped to 80 columns.
+/// Help pages: purpose, usage, examples, then every argument, option and command, notes and exit
+/// statuses. Descriptions are wrapped to 80 columns.
 class HelpFormatter final : public CLI::Formatter {
 public:
     HelpFormatter();
@@ -18,7 +18,7 @@ public:
     std::string make_option(const CLI::Option* option, bool isPositional) const override;
     std::string make_subcommand(const CLI::App* command) const override;
     std::string make_option_name(const CLI::Option* option, bool isPositional) const override;
-    /// Without the library's marks for what an option demands.
+    /// Omits the library's marks for requirements of an option.
     std::string make_option_opts(const CLI::Option* option) const override;
 };
 

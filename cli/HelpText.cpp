@@ -9,7 +9,7 @@ namespace {
 constexpr std::string_view kExamples = "Examples:\n";
 constexpr std::string_view kStatuses = "Exit status:\n";
 
-/// The text up to `end`, which is taken away with it.
+/// Removes and returns the text up to `end`; also removes `end`.
 std::string_view takeUntil(std::string_view end, std::string_view& text) {
     const std::string_view taken = text.substr(0, text.find(end));
     text.remove_prefix(std::min(taken.size() + end.size(), text.size()));

@@ -6,8 +6,8 @@
 
 namespace pallax {
 
-/// What a command's help says beside its options. It is written as one text, paragraphs with an
-/// empty line between them: "Examples:", notes, and last "Exit status:", a status on each line.
+/// The parts of a command's help besides its options. They are written as one text, paragraphs
+/// separated by an empty line: "Examples:", notes, and last "Exit status:", one status per line.
 struct HelpText {
     struct Status {
         std::string number;

@@ -36,7 +36,7 @@ std::string italic(std::string_view text) {
     return "\\fI" + roffText(text) + "\\fR";
 }
 
-/// What is in lower case is typed as it stands, what is in upper case is filled in.
+/// Lower-case words are literal, upper-case words are placeholders.
 std::string valueOf(std::string_view value) {
     std::string result;
     while (!value.empty()) {
@@ -114,7 +114,7 @@ std::string commandsOf(const CommandDescription& program) {
     return list;
 }
 
-/// What the help of the screen lists.
+/// The keys that the help page on the screen lists.
 std::string keysOnScreen() {
     std::string list = ".SH KEYS\n";
     for (const terminal::KeyHelp& help : terminal::keyHelp()) {
@@ -136,7 +136,7 @@ std::string seeAlso(const CommandDescription& program, const CommandDescription*
     return list + ".BR pallax.conf (5),\n.BR pallax\\-recording (7),\n.BR pallax\\-sections (7)\n";
 }
 
-/// "Pallax shows that." as "shows that", for it stands behind the name.
+/// "shows that" for "Pallax shows that.", because it follows the name.
 std::string_view titleOf(std::string_view description) {
     constexpr std::string_view kSubject = "Pallax ";
     if (description.starts_with(kSubject)) {

@@ -11,14 +11,14 @@
 #include <utility>
 #include <vector>
 
-/// What several commands' options are made of.
+/// Parts of the options of several commands.
 namespace pallax {
 
-/// "NAME: "TEXT" is none of NAMES", which are separated by |; the nearest of them is proposed.
+/// "NAME: "TEXT" is not one of NAMES", which are separated by |, with a suggestion of the nearest.
 CLI::ValidationError unknownChoice(const std::string& name, const std::string& text,
                                    const std::string& names);
 
-/// Every choice goes by its name in the map, in the help and in the message about a wrong one.
+/// The names of the choices in the map are used in the help and in errors.
 template <class Value>
 CLI::Option* addChoice(CLI::App& app, const std::string& name, Value& value,
                        const std::vector<std::pair<std::string, Value>>& choices,
@@ -38,7 +38,7 @@ CLI::Option* addChoice(CLI::App& app, const std::string& name, Value& value,
     return app.add_option_function<std::string>(name, take, description)->type_name(names);
 }
 
-/// A whole number within bounds; CLI11's own takes "-1" for a large one.
+/// A whole number within limits; CLI11's own accepts "-1" as a large one.
 template <class Value>
 Value numberOf(const char* option, const std::string& text, Value least, Value most) {
     Value number{};

@@ -20,7 +20,7 @@ namespace pallax {
 /// The command line asks for no more than a text, or cannot be understood.
 struct ParseEnd {
     ExitStatus status; ///< success (help or version, for standard output) or wrong usage
-    std::string text;  ///< with its line end
+    std::string text;  ///< including its line end
 };
 
 /// `pallax service --status`.
@@ -29,15 +29,15 @@ struct ServiceStatusOptions {};
 using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions,
                                    ServiceStatusOptions, SimulateOptions, ParseEnd>;
 
-/// What browsing, decoding and recording take. The options outlive the app.
+/// The options for browsing, decoding and recording, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);
 void addDecode(CLI::App& app, DecodeOptions& options);
 void addRecord(CLI::App& app, RecordOptions& options);
-/// What is common to all ways of browsing.
+/// The options of all ways of browsing.
 void addView(CLI::App& app, BrowseOptions& options);
 
-/// One sentence, without its full stop, about what cannot be understood; the command's help, if one
-/// is named, tells more.
+/// One sentence, without its full stop, about an invalid command line; refers to the help of the
+/// command, if given.
 ParseEnd wrongUsage(std::string reason, const std::string& command = {});
 
 /// `arguments` are those after the program's name.

@@ -51,7 +51,7 @@ void addServiceRelay(CLI::App& app, std::string& relayed, ServiceOptions& option
            "--relay", take, "Relay the live pcap stream on standard input (-) to every client")
         ->type_name("-")
         ->excludes("--play")
-        ->excludes("--speed") // the stream has its own
+        ->excludes("--speed") // the stream sets the pace
         ->excludes("--simulate");
     constexpr double kLongest = 1e6; // eleven days
     static constexpr const char* kRefusal = "must be a number from 0 to 1000000";

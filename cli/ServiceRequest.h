@@ -6,16 +6,16 @@
 
 namespace pallax {
 
-/// What the service is to do, one of them.
+/// What the service should do: play, simulate, relay or print its status, exactly one of them.
 struct ServiceRequest {
     ServiceOptions options;
-    std::string relayed; ///< a stream; empty where none is asked for
+    std::string relayed; ///< the stream to relay; empty for none
     bool status = false;
 };
 
 void addService(CLI::App& app, ServiceRequest& request);
 
-/// What to run, or why it cannot be.
+/// The options of the service, or an error.
 ParsedOptions serviceOptions(const ServiceRequest& request);
 
 } // namespace pallax

@@ -51,7 +51,7 @@ CLI::Option* addSeed(CLI::App& app, const std::function<void(std::uint64_t)>& ta
 }
 
 CLI::Option* addRate(CLI::App& app, const std::function<void(unsigned)>& take) {
-    // Fewer would not even hold what happens to the phone.
+    // Fewer could not even carry the events.
     constexpr unsigned kLeast = 5;
     constexpr unsigned kMost = 1000000;
     return app

@@ -16,11 +16,11 @@ namespace pallax {
 /// The technology that `demo` shows when none is named.
 const RecordedTechnology* usualSimulatedTechnology();
 
-/// The options that begin a simulation's: `[TECHNOLOGY] --seed --rate --seconds --speed`.
+/// Adds the options of demo: `[TECHNOLOGY] --seed --rate --seconds --speed`.
 void addDemo(CLI::App& app, SimulationOptions& simulation, PlayOptions& play);
-/// `TECHNOLOGY --seconds N --seed --rate -o FILE`.
+/// Adds `TECHNOLOGY --seconds N --seed --rate -o FILE`.
 void addSimulate(CLI::App& app, SimulateOptions& options);
-/// `--simulate TECHNOLOGY --seed --rate --seconds`; the first of them.
+/// Adds `--simulate TECHNOLOGY --seed --rate --seconds`; returns the first.
 CLI::Option* addServiceSimulation(CLI::App& app, std::optional<SimulationOptions>& simulation);
 
 } // namespace pallax

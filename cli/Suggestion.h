@@ -7,15 +7,15 @@
 
 namespace pallax {
 
-/// How many letters must be put in, left out, replaced or swapped with their neighbour to make
-/// one word of the other.
+/// How many letters must be inserted, deleted, replaced or swapped with their neighbour to turn one
+/// word into the other.
 std::size_t editDistance(std::string_view one, std::string_view other);
 
-/// The first of the names that `word` is closest to, if it can be a slip of the hand: at most one
-/// letter in three is wrong. Empty when there is none.
+/// The first of the names closest to `word`, if it can be a typing error: at most one letter in
+/// three is wrong. Otherwise empty.
 std::string nearestName(std::string_view word, const std::vector<std::string>& names);
 
-/// ". Did you mean "decode"?", or nothing: the end of a sentence about a word that is unknown.
+/// ". Did you mean "decode"?", or empty: the end of a sentence about an unknown word.
 std::string suggestion(std::string_view word, const std::vector<std::string>& names);
 
 } // namespace pallax

@@ -5,7 +5,7 @@ namespace pallax {
 
 namespace {
 
-/// The text with a backslash before each of `special`, ready to stand between single quotes.
+/// The text with a backslash before each of `special`, for use in single quotes.
 std::string escaped(const std::string& text, std::string_view special) {
     std::string result;
     for (const char character : text) {
@@ -33,7 +33,7 @@ std::string actionOf(const OptionDescription& option) {
     return formatText("(%@)", {names});
 }
 
-/// ":MESSAGE:ACTION", as _arguments takes it.
+/// ":MESSAGE:ACTION", in the form of _arguments.
 std::string valueOf(const OptionDescription& option) {
     const std::string& message = option.value.empty() ? option.names.front() : option.value;
     return formatText(":%@:%@", {escaped(message, ":\\"), actionOf(option)});

@@ -43,7 +43,7 @@ ExitStatus run(std::vector<std::string> arguments) {
     try {
         return std::visit(Run(), parseOptions(std::move(arguments)));
     } catch (const OutputClosed&) {
-        return kExitSuccess; // whoever reads has seen enough
+        return kExitSuccess; // the reader has seen enough
     } catch (const FatalRecord& fatal) {
         complain(fatal.what());
         return kExitFatalRecord;
@@ -57,12 +57,12 @@ ExitStatus run(std::vector<std::string> arguments) {
 
 int main(int argc, char** argv) {
     if (!openStandardDescriptors()) {
-        return kExitFailure; // there is nowhere to say so
+        return kExitFailure; // standard error cannot be used
     }
     if (argc > 1 && argv[1] == kChildServiceCommand) {
         return runChildService(argc, argv);
     }
-    // A closed pipe, and a file that may not grow, are errors of write.
+    // Write reports a closed pipe, or a file that may not grow, as an error.
     (void)std::signal(SIGPIPE, SIG_IGN);
     (void)std::signal(SIGXFSZ, SIG_IGN);
     return run({argv + (argc > 0 ? 1 : 0), argv + argc});

@@ -37,7 +37,7 @@ void Output::lineDone() {
 void Output::flush() {
     if (!_text.empty()) {
         _taken.clear();
-        std::swap(_text, _taken); // what could not be written is not tried again
+        std::swap(_text, _taken); // a failed write is not repeated
         _write(_taken);
     }
 }

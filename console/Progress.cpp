@@ -8,7 +8,7 @@ namespace pallax {
 
 bool ProgressPace::look() {
     constexpr std::chrono::milliseconds kQuick{1};
-    constexpr unsigned kMostPieces = 64; // as slow ones follow quick ones, so many go unseen
+    constexpr unsigned kMostPieces = 64; // as many slow pieces after quick ones go unnoticed
     const Time now = _clock.now();
     _piecesPerLook = now - _look < kQuick ? std::min(2 * _piecesPerLook, kMostPieces) : 1;
     _look = now;

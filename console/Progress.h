@@ -9,19 +9,18 @@
 
 namespace pallax {
 
-/// When it is time to tell how far a long run has come: not before it has taken two seconds, and
-/// then a few times a second.
+/// Decides when to show the progress of a long run: first after two seconds, and then several times
+/// a second.
 class ProgressPace {
 public:
     static constexpr std::chrono::seconds kPatience{2};
     static constexpr std::chrono::milliseconds kInterval{200};
 
-    /// The run begins now.
+    /// The run starts now.
     explicit ProgressPace(const Clock& clock) : _clock(clock), _begin(clock.now()), _look(_begin) {}
 
-    /// To be asked after each little piece of the run. It looks at the clock rarely where the
-    /// pieces are quick, and at each of them once they are found to be slow: the first slow ones,
-    /// up to 63, go unseen.
+    /// Call this after each small piece of the run. It checks the clock rarely while the pieces are
+    /// quick, and after each piece once they are slow; it misses the first slow ones, up to 63.
     bool isDue() {
         if (++_pieces < _piecesPerLook) {
             return false;
@@ -35,8 +34,8 @@ private:
 
     const Clock& _clock;
     Time _begin;
-    Time _look;                // the latest
-    std::optional<Time> _told; // when it was due the last time
+    Time _look;                // the latest check
+    std::optional<Time> _told; // when it was last due
     unsigned _pieces = 0;
     unsigned _piecesPerLook = 1;
 };

@@ -4,11 +4,11 @@
 
 namespace pallax {
 
-/// What the machine's log gets unless the settings say otherwise: failures. Every packet makes
-/// several lines of less urgency.
+/// The system log's level unless set otherwise: failures. Every packet causes several lines of
+/// lower priority.
 constexpr int kSyslogLevel = static_cast<int>(LogPriority::Error);
 
-/// The system log goes to `sink` while this lives. The sink outlives it.
+/// Sends the system log to `sink` while it lives. The sink must outlive it.
 class ScopedLog {
 public:
     explicit ScopedLog(LogSink& sink, int threshold = SystemLog::kEverything) {

@@ -4,7 +4,7 @@
 
 namespace pallax {
 
-/// Passes each line to two sinks, to each up to a level of its own. Both outlive it.
+/// Passes each line to two sinks, each with its own level. Both must outlive it.
 class TeeSink final : public LogSink {
 public:
     TeeSink(LogSink& first, int firstLevel, LogSink& second, int secondLevel)

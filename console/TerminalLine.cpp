@@ -10,7 +10,7 @@
 namespace pallax {
 
 TerminalLine TerminalLine::onStandardError() {
-    constexpr std::size_t kUsualColumns = 80; // of a terminal that does not tell
+    constexpr std::size_t kUsualColumns = 80; // for a terminal of unknown width
     winsize size{};
     const bool isTerminal = ::isatty(STDERR_FILENO) != 0;
     const bool isTold = ::ioctl(STDERR_FILENO, TIOCGWINSZ, &size) == 0 && size.ws_col > 0;
@@ -27,8 +27,8 @@ void TerminalLine::show(std::string_view text) {
     }
     std::string bytes = "\r";
     appendPrintable(bytes, text);
-    bytes.resize(
-        std::min(bytes.size(), _columns)); // with the return, less the last, which may wrap
+    bytes.resize(std::min(bytes.size(), _columns)); // including the return, less the last column,
+                                                    // which may wrap
     const std::size_t fitting = bytes.size() - 1;
     bytes.append(_shown - std::min(_shown, fitting), ' ');
     _shown = fitting;

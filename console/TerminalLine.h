@@ -7,28 +7,28 @@
 
 namespace pallax {
 
-/// One line of a terminal that is written again and again, in place, without control sequences.
+/// One line of a terminal that is rewritten in place, without control sequences.
 class TerminalLine {
 public:
     using Write = std::function<void(std::string_view bytes)>;
 
-    /// A terminal that is `columns` wide; with 0, there is none, and nothing is written.
+    /// For a terminal of `columns` columns; 0 means no terminal, and nothing is written.
     TerminalLine(std::size_t columns, Write write) : _columns(columns), _write(std::move(write)) {}
-    /// On standard error, where that is a terminal.
+    /// On standard error, if that is a terminal.
     static TerminalLine onStandardError();
 
     bool isPossible() const { return _columns > 0; }
-    /// In place of what is shown; what does not fit is left out.
+    /// Replaces the line; text that does not fit is cut.
     void show(std::string_view text);
-    /// Nothing of it stays.
+    /// Clears the line.
     void wipe();
-    /// What is shown stays, and what follows stands below it.
+    /// Keeps the line; further output starts below it.
     void leave();
 
 private:
     std::size_t _columns;
     Write _write;
-    std::size_t _shown = 0; // columns
+    std::size_t _shown = 0; // columns in use
 };
 
 } // namespace pallax

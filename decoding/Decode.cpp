@@ -38,7 +38,7 @@ std::optional<std::string> lossOfInput(const DecodeOptions& options) {
                      : std::nullopt;
 }
 
-/// Gives the command, wired to this machine, to `use`.
+/// Calls `use` with the command, connected to this machine.
 template <class Use>
 ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, const Use& use) {
     const RequiredTemplates resources(DirectoryResources::programFolder());
@@ -56,7 +56,7 @@ ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, c
     return use(command);
 }
 
-/// Whole lines at a time, which may come on the same terminal as the progress.
+/// Writes whole lines, possibly to the same terminal as the progress.
 Output::Write standardOutput(DecodeProgress& progress) {
     return [&progress,
             write = writeToDescriptor(STDOUT_FILENO, "Standard output")](std::string_view block) {
@@ -71,7 +71,7 @@ ExitStatus decodeOneByOne(const DecodeOptions& options, DecodeProgress& progress
                        [&](DecodeCommand& command) { return command.run(output); });
 }
 
-/// A worker's piece of the work, into its files.
+/// Decodes one recording in a worker, into its files.
 ExitStatus decodeInWorker(const DecodeOptions& options, DecodeProgress& progress,
                           std::size_t recording, const WorkerFiles& files) {
     progress.becomeWorker();
@@ -101,7 +101,7 @@ ExitStatus decodeInWorker(const DecodeOptions& options, DecodeProgress& progress
     return status;
 }
 
-/// What the recordings give, in their order, as decoding one by one would have written it.
+/// Writes the workers' output in the order of the recordings, as if they were decoded one by one.
 class DecodeCollector {
 public:
     DecodeCollector(const DecodeOptions& options, DecodeProgress& progress, FileSink* log)
@@ -155,7 +155,7 @@ ExitStatus decodeAtOnce(const DecodeOptions& options, DecodeProgress& progress, 
     return collector.status();
 }
 
-/// How many processes decode. What a live recording gives must not wait for its end; but several
+/// The number of processes. Displays of a live recording must not wait for its end; but several
 /// pipes may have one writer, which waits until all of them are opened.
 unsigned jobsFor(const DecodeOptions& options) {
     const auto& recordings = options.recordings;

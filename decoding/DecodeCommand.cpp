@@ -26,7 +26,7 @@ ExitStatus DecodeCommand::run(Output& output) {
     for (std::size_t place = 0; place < _options.recordings.size(); ++place) {
         const ExitStatus result = decodeNext(place, {output, *displays});
         status = result == kExitSuccess ? status : result;
-        output.flush(); // the next recording may be one that is waited for
+        output.flush(); // the next recording may have to be waited for
         if (result == kExitFatalRecord) {
             break;
         }
@@ -98,7 +98,7 @@ ExitStatus DecodeCommand::decodePackets(Recording& recording, RecordingDecoder& 
             }
         }
         if (isWaitedFor) {
-            output.flush(); // what a packet has completed is read before the next one comes
+            output.flush(); // a completed display must not wait for the next packet
         }
         if (_watcher != nullptr) {
             _watcher->packetDone(_place, recording, decoder.packets());

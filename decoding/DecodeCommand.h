@@ -17,14 +17,14 @@ enum class DecodeFormat { Json, Csv };
 
 struct DecodeOptions {
     std::vector<std::string> recordings;
-    /// What to take every recording for, whatever its link type says.
+    /// The technology of every recording, overriding its link type.
     const RecordedTechnology* technology = nullptr;
-    /// Nothing: the last display, or in CSV, which tells what changes, every tick.
+    /// If missing: the last display or, for CSV, which shows changes, every tick.
     std::optional<Every> every;
     DecodeFormat format = DecodeFormat::Json;
     std::optional<std::string> systemLog; ///< path of a text file
     bool strict = false;
-    /// How many recordings are decoded at once; nothing: one on each core.
+    /// How many recordings are decoded at once; if missing, one per core.
     std::optional<unsigned> jobs;
 
     Every chosenEvery() const {
@@ -32,43 +32,43 @@ struct DecodeOptions {
     }
 };
 
-/// Is told how decoding goes on; the recordings are told by their place on the command line.
+/// Receives the progress of decoding; recordings are identified by their position on the command
+/// line.
 class DecodeWatcher {
 public:
     virtual ~DecodeWatcher() = default;
-    /// After each packet, of which `source` has given so many.
+    /// Called after each packet; `source` has delivered this many.
     virtual void packetDone(std::size_t recording, const Recording& source,
                             std::uint64_t packets) = 0;
-    /// At its end, also of one that could not be opened or read on.
+    /// Called at its end, even if it could not be opened or read further.
     virtual void recordingDone(std::size_t recording) = 0;
 };
 
-/// `pallax decode`: recordings to JSON or CSV, in the order of the command line, each with a
-/// generator and a state of its own. A recording that cannot be read does not keep the others
-/// from being decoded.
+/// `pallax decode`: recordings to JSON or CSV, in the order of the command line, each with its own
+/// generator and state. A recording that cannot be read does not stop the others.
 class DecodeCommand {
 public:
     using Open = std::function<Recording::OpenResult(const std::string& path)>;
-    /// Gets one sentence for the user.
+    /// Receives one sentence for the user.
     using Report = std::function<void(std::string_view sentence)>;
 
-    /// The watcher, if any, outlives the command.
+    /// The watcher, if any, must outlive the command.
     DecodeCommand(const DecodeOptions& options, const DecoderEnvironment& environment, Open open,
                   Report report, DecodeWatcher* watcher = nullptr)
         : _options(options), _environment(environment), _open(std::move(open)),
           _report(std::move(report)), _watcher(watcher) {}
 
-    /// Writes to `output`, whose exceptions leave, and TemplateFailure. What a recording gives that
-    /// is waited for (a pipe) is written with each display, that of a file in blocks.
+    /// Writes to `output`. Exceptions of `output` and TemplateFailure propagate. Displays of a pipe
+    /// are written without delay, those of a file in blocks.
     ExitStatus run(Output& output);
-    /// The same for one of the recordings, by its place; only the first writes what stands at the
-    /// head of the whole output.
+    /// The same for one of the recordings, by position; only the first writes the head of the whole
+    /// output.
     ExitStatus runOne(std::size_t recording, Output& output);
 
 private:
     struct Destination {
         Output& output;
-        DisplayOutput& displays; // which end up there
+        DisplayOutput& displays; // which writes to it
     };
 
     ExitStatus decodeNext(std::size_t place, const Destination& destination);
@@ -81,7 +81,7 @@ private:
     Open _open;
     Report _report;
     DecodeWatcher* _watcher;
-    std::size_t _place = 0; // of the recording that is being decoded
+    std::size_t _place = 0; // of the current recording
 };
 
 } // namespace pallax

@@ -11,7 +11,7 @@ namespace pallax {
 
 namespace {
 
-/// Nothing for what has no size; 0 for what is not there and will not be decoded.
+/// Nothing without a size; 0 for a missing file, which will not be decoded.
 std::optional<std::uint64_t> sizeOf(const std::string& path) {
     if (path == "-") {
         return std::nullopt;
@@ -56,7 +56,7 @@ DecodeProgress::~DecodeProgress() {
 }
 
 void DecodeProgress::wipe() {
-    if (!_isWorker) { // which may have been forked while something was shown
+    if (!_isWorker) { // unless forked while a line was shown
         _line.wipe();
     }
 }

@@ -14,9 +14,9 @@
 
 namespace pallax {
 
-/// Tells on a line of a terminal how much of some recordings is decoded: the share of their bytes,
-/// or, where one has no size (a pipe), how many packets. What is counted lies in memory that is
-/// shared with processes forked later, so that several may decode.
+/// Shows on a line of a terminal how far decoding has come: the share of the bytes or, if a
+/// recording has no size (a pipe), the number of packets. The counters are in memory shared with
+/// processes forked later, so that several can decode.
 class DecodeProgress final : public DecodeWatcher {
 public:
     DecodeProgress(const std::vector<std::string>& recordings, TerminalLine line,
@@ -28,13 +28,13 @@ public:
     void packetDone(std::size_t recording, const Recording& source, std::uint64_t packets) override;
     void recordingDone(std::size_t recording) override;
 
-    /// False without a terminal: then nothing needs to be counted.
+    /// False without a terminal; then counting is unnecessary.
     bool isShown() const { return _tallies != nullptr; }
-    /// In a forked process, which counts but shows nothing.
+    /// For a forked process, which counts but shows nothing.
     void becomeWorker() { _isWorker = true; }
-    /// Shows what is counted, if it is time.
+    /// Shows the progress, if it is time.
     void look();
-    /// Before anything else is written to the terminal.
+    /// Clears the line; call this before other output to the terminal.
     void wipe();
 
 private:
@@ -55,7 +55,7 @@ private:
     bool _areSizesKnown = true;
     std::unique_ptr<Tally[], Unmap> _tallies{
         nullptr, Unmap{0}};     ///< one for each recording; null without a terminal
-    std::uint64_t _packets = 0; ///< of the recording that is being decoded here
+    std::uint64_t _packets = 0; ///< of the recording being decoded here
     bool _isWorker = false;
 };
 

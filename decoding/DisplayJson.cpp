@@ -63,7 +63,7 @@ void appendEscaped(std::string& out, std::string_view text) {
     }
 }
 
-/// The value is appended first and looked at where it lies, for almost every text is plain.
+/// Appends the value first and checks it in place, because almost every text needs no escape.
 void appendStringValue(std::string& out, const PropertyList& object) {
     out += '"';
     const std::size_t start = out.size();

@@ -5,19 +5,19 @@
 #include <string>
 #include <string_view>
 
-/// Property lists as compact JSON, appended to a text that the caller owns. Written straight out:
-/// a recording of millions of packets asks for a display after each.
+/// Property lists as compact JSON, appended to a text that the caller owns. Streamed without a
+/// document tree: a recording of millions of packets can have a display for each.
 namespace pallax {
 
-/// Containers nested deeper are written as null.
+/// Containers nested deeper become null.
 inline constexpr int kDeepestJson = 512;
 
-/// A string (a display number too) becomes its text, data base64, a date its ISO 8601 text, a real
-/// the shortest number that reads back the same (null when it is not finite). Keys keep their
-/// order; an entry whose key is no string is left out.
+/// A string (including a display number) becomes its text, data base64, a date its ISO 8601 text, a
+/// real the shortest number that reads back the same (null if not finite). Keys keep their order;
+/// entries with a key that is not a string are omitted.
 void appendJson(std::string& out, const PropertyList& object);
 
-/// One quoted JSON string. Each byte that is not part of valid UTF-8 becomes U+FFFD.
+/// One quoted JSON string. Each invalid UTF-8 byte becomes U+FFFD.
 void appendJsonString(std::string& out, std::string_view text);
 
 } // namespace pallax

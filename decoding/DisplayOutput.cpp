@@ -30,7 +30,7 @@ void appendCell(std::string& out, std::string_view text) {
     appendValidUtf8(out, quoted);
 }
 
-/// The number as its text shows it, without padding and plus sign; a hexadecimal one decimal.
+/// The number as in its text, without padding and plus sign; a hexadecimal one in decimal.
 void appendBareNumber(std::string& out, const DisplayNumber& number) {
     const NumberConversion& shown = number.format().conversion();
     NumberConversion bare;
@@ -77,7 +77,7 @@ std::string cellsOf(const PropertyList& value) {
     return cells;
 }
 
-/// For certain, without the texts being made: false may still mean the same text.
+/// Compares without formatting the texts: false does not mean that they differ.
 bool isSameText(const PropertyList& a, const PropertyList& b) {
     const DisplayNumber* number = a.displayNumber();
     const DisplayNumber* otherNumber = b.displayNumber();
@@ -129,7 +129,7 @@ void CsvOutput::show(const DisplayMoment& moment, const PropertyList& display) {
     }
 }
 
-/// Walks the values as the display tree does, which keeps only texts.
+/// Visits the values in the order of the display tree, which keeps only texts.
 void CsvOutput::showValue(const PropertyList& value) {
     if (const DictionaryRef dictionary = value.dictionary()) {
         for (const ShownEntry& entry : shownEntries(*dictionary)) {

@@ -16,23 +16,24 @@ namespace pallax {
 /// How often a recording's display is shown.
 enum class Every { End, Tick, Packet };
 
-/// When a display was as it is shown.
+/// The time of a display.
 struct DisplayMoment {
     std::uint64_t number = 0; ///< of the tick or packet, from 1
     Time time;
 };
 
-/// Where the displays of recordings go, one recording after the other.
+/// The output of displays, one recording after the other.
 class DisplayOutput {
 public:
     virtual ~DisplayOutput() = default;
     virtual void beginRecording() = 0;
-    /// `display` is null when there is none yet.
+    /// `display` is null if there is none yet.
     virtual void show(const DisplayMoment& moment, const PropertyList& display) = 0;
 };
 
-/// One JSON object a line: the display itself with Every::End, else
-/// {"tick":1,"time":"2023-11-14T22:13:20.000Z","display":{…}}, "packet" instead of "tick".
+/// One JSON object per line: the display itself with Every::End, otherwise
+/// {"tick":1,"time":"2023-11-14T22:13:20.000Z","display":{…}}, with "packet" instead of "tick" for
+/// packets.
 class JsonOutput final : public DisplayOutput {
 public:
     JsonOutput(Output& output, Every every) : _output(output), _every(every) {}
@@ -45,15 +46,15 @@ private:
     Every _every;
 };
 
-/// A table "time,path,value,number,unit" (RFC 4180, lines end in "\n"; the header once): a row
-/// when the value at a path of the display tree is not what it was in the recording's previous
-/// display. The rows of one display come in display order; then, by path, those of the paths that
-/// are gone, whose value, number and unit are empty. A value that is no string is written as in
-/// JSON. `number` is the bare decimal number of a value that is one, empty for any other (and for
-/// one that is not finite).
+/// A table "time,path,value,number,unit" (RFC 4180, lines end in "
+/// "; the header once), with a row for each path of the display tree whose value differs from the
+/// recording's previous display. The rows of one display are in display order, followed by those of
+/// removed paths, by path, with empty value, number and unit. A value that is not a string is
+/// written as in JSON. `number` is the decimal number of a numeric value, and empty for any other
+/// (and if not finite).
 class CsvOutput final : public DisplayOutput {
 public:
-    /// Without its header the table goes on after another one.
+    /// Without its header the table continues another one.
     explicit CsvOutput(Output& output, bool withHeader = true);
 
     void beginRecording() override {
@@ -66,11 +67,11 @@ public:
 private:
     struct Shown {
         PropertyList value;
-        std::string pathCell; ///< the path as written
-        std::string cells;    ///< "value,number,unit" as written
+        std::string pathCell; ///< the path as CSV
+        std::string cells;    ///< "value,number,unit" as CSV
         std::uint64_t display = 0;
     };
-    /// By path and count of earlier nodes of the same path in the display.
+    /// By path and count of earlier nodes with the same path in the display.
     using Rows = std::map<std::pair<std::string, int>, Shown>;
 
     /// The value at `_path`.
@@ -82,13 +83,13 @@ private:
 
     Output& _output;
     Rows _shown;
-    /// The rows of the previous display and of this one in their order: the next row is mostly the
-    /// one that came next before, and need not be searched.
+    /// The rows of the previous display and of this one in order: the next row is usually the one
+    /// that came next before, so no search is needed.
     std::vector<Rows::iterator> _before;
     std::vector<Rows::iterator> _order;
     std::uint64_t _display = 0;
     std::string _time;
-    std::string _path; ///< of the value that is being shown
+    std::string _path; ///< of the current value
 };
 
 } // namespace pallax

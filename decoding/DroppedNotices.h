@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// Drops the notices that generators print when they end: while displays are written to standard
-/// output, nothing else may be.
+/// Discards the notices that generators print on destruction, because standard output carries only
+/// displays.
 class DroppedNotices final : public StandardOutput {
 public:
     void printLine(std::string_view /*line*/) override {}

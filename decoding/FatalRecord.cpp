@@ -26,8 +26,8 @@ MessagePorts::Local GuardedMessagePorts::createLocal(std::string_view name,
                                                      ReceiveCallback receive) {
     auto guarded = [this, receive = std::move(receive)](std::int32_t identifier,
                                                         Bytes data) -> std::optional<ByteBuffer> {
-        // The callback may destroy the port, and with it this closure: nothing of it is touched
-        // once the callback has been called.
+        // The callback may destroy the port, and with it this closure: use nothing of it after the
+        // call.
         GuardedMessagePorts* const self = this;
         const std::uint64_t counted = identifier == 0 ? ++_packets : _packets;
         const std::uint32_t told = _packetNumber ? _packetNumber() : 0;

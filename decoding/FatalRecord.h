@@ -12,32 +12,32 @@
 
 namespace pallax {
 
-/// What to do when a record's parser throws.
+/// What to do when a record throws.
 enum class OnFatalRecord {
-    Stop, ///< end with one clear sentence
-    Skip, ///< drop the packet, log the sentence, go on
+    Stop, ///< exit with one sentence
+    Skip, ///< drop the packet, log the sentence, continue
 };
 
-/// The effective log code of a message; nothing when it is no log record.
+/// The effective log code of a message; nothing if it is not a log record.
 std::optional<LogCode> logCodeOf(Bytes message);
 
-/// "packet 17 (log code 0xFF0000): SIM file data unreadable", or "packet 17 (no log code): …" for
-/// what is no log record. Packets are counted from 1.
+/// "packet 17 (log code 0xFF0000): SIM file data unreadable", or "packet 17 (no log code): …" for a
+/// message that is not a log record. Packets are counted from 1.
 std::string fatalRecordSentence(std::uint64_t packet, Bytes message, std::string_view reason);
 
-/// A record has ended the program; the text is the sentence.
+/// A fatal record has ended the program; the text is the sentence.
 class FatalRecord : public std::runtime_error {
 public:
     using std::runtime_error::runtime_error;
 };
 
-/// Message ports whose receive callbacks may throw: counts the packets (messages of identifier
-/// 0, over all local ports) where the source does not number them, and turns an exception into
-/// FatalRecord, which leaves through whoever runs the main queue, or with Skip into a line of the
-/// system log. It outlives its ports.
+/// Message ports whose receive callbacks may throw. Counts the packets (messages of identifier 0,
+/// over all local ports) if the source does not number them, and turns an exception into
+/// FatalRecord, which propagates to the caller that runs the main queue, or with Skip into a line
+/// of the system log. Must outlive its ports.
 class GuardedMessagePorts final : public MessagePorts {
 public:
-    /// The number of the packet being delivered as its source counts, or 0.
+    /// The number of the current packet in its source, or 0.
     using PacketNumber = std::function<std::uint32_t()>;
 
     GuardedMessagePorts(MessagePorts& ports, OnFatalRecord onFatalRecord,

@@ -21,10 +21,10 @@ namespace pallax {
 
 namespace {
 
-/// How many pieces may be done or under way ahead of the one that is collected next: each holds
-/// three descriptors. Where there are fewer, the next piece waits for others to be collected.
+/// How many pieces may be finished or running ahead of the one collected next: each holds three
+/// descriptors. If descriptors run out, the next piece waits for others to be collected.
 constexpr std::size_t kMostAhead = 64;
-/// Of a worker whose work threw; no exit status of a decode.
+/// The exit status of a worker whose work has thrown; not a status of decode.
 constexpr int kGaveUp = 71;
 
 HostError cannotStart(std::string_view what) {
@@ -41,7 +41,7 @@ Descriptor unnamedFile() {
     return file;
 }
 
-/// Blocks the signal of a child's end, or lets it through, and undoes that at the end.
+/// Blocks or unblocks the signal of a child's end for a scope.
 class ChildSignal {
 public:
     explicit ChildSignal(int how) {
@@ -52,7 +52,7 @@ public:
     ChildSignal(const ChildSignal&) = delete;
     ChildSignal& operator=(const ChildSignal&) = delete;
 
-    /// Until a child ends, or for a moment; it is to be blocked.
+    /// Waits until a child ends, or briefly; the signal must be blocked.
     static void waitBriefly() {
         constexpr long kNanoseconds = 100'000'000;
         const timespec moment{0, kNanoseconds};
@@ -121,8 +121,8 @@ OrderedWorkers::~OrderedWorkers() {
 }
 
 std::optional<HostError> OrderedWorkers::run(const Collect& collect) {
-    (void)std::signal(SIGCHLD, SIG_DFL);  // whoever ignores it learns of no child's end
-    const ChildSignal blocked(SIG_BLOCK); // it is waited for
+    (void)std::signal(SIGCHLD, SIG_DFL);  // if ignored, no child's end would be reported
+    const ChildSignal blocked(SIG_BLOCK); // it is received by waiting
     for (std::size_t piece = 0; piece < _pieces; ++piece) {
         while (_workers.empty() || !_workers.front().outcome) {
             std::optional<HostError> error;
@@ -131,7 +131,7 @@ std::optional<HostError> OrderedWorkers::run(const Collect& collect) {
                 error = startNext();
             }
             if (running() == 0) {
-                return error; // with others under way there will be room for the next one
+                return error; // once running ones end, there is room for the next
             }
             waitForOne();
         }
@@ -169,10 +169,10 @@ std::optional<HostError> OrderedWorkers::startNext() {
     return std::nullopt;
 }
 
-/// Ends without the ends of what the parent has begun: no destructor runs, no buffer is written.
+/// Exits without cleaning up the parent's objects: runs no destructor, writes no buffer.
 void OrderedWorkers::become(Worker& worker, std::size_t piece) {
     (void)::prctl(PR_SET_PDEATHSIG, SIGKILL);
-    _workers.clear(); // their files would leave this one too few descriptors to open its own
+    _workers.clear(); // their files would leave too few descriptors for this worker
     const ChildSignal unblocked(SIG_UNBLOCK);
     if (::dup2(worker.files.output.number(), STDOUT_FILENO) < 0 ||
         ::dup2(worker.files.complaints.number(), STDERR_FILENO) < 0) {
@@ -187,7 +187,7 @@ void OrderedWorkers::become(Worker& worker, std::size_t piece) {
     ::_exit(status);
 }
 
-/// Waits until a worker has ended; negative when that cannot be learnt.
+/// Waits until a worker has ended; negative on failure.
 pid_t OrderedWorkers::nextEnded(int& status) const {
     if (!_meanwhile) {
         return ::waitpid(-1, &status, 0);

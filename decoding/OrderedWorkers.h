@@ -14,8 +14,8 @@
 
 namespace pallax {
 
-/// Files that nobody else sees and that end with their last descriptor: where a worker process
-/// writes, until it is its turn in the order.
+/// Unnamed files that disappear with their last descriptor: a worker process writes to them until
+/// it is its turn in the order.
 struct WorkerFiles {
     Descriptor output;
     Descriptor complaints; ///< sentences for standard error
@@ -24,47 +24,47 @@ struct WorkerFiles {
     static Result<WorkerFiles, HostError> create();
 };
 
-/// Hands the whole content of a worker's file on, in blocks; throws OutputFailure where it cannot
-/// be read.
+/// Passes the whole content of a worker's file on, in blocks; throws OutputFailure if it cannot be
+/// read.
 void readWhole(const Descriptor& file, const std::function<void(std::string_view)>& take);
 
-/// Pieces of work that processes of their own do, so many at once, each with its files; what they
-/// leave is collected in the order of the pieces. Processes, for the array lock is process-wide and
-/// may stay held by whoever has walked nested arrays.
+/// Runs pieces of work in separate processes, several at once, each with its files, and collects
+/// their output in the order of the pieces. Processes, because the array lock is process-wide and
+/// may stay held by a thread that has walked nested arrays.
 class OrderedWorkers {
 public:
-    /// Done in the worker, whose standard output and error are its files. An exception is reported
-    /// there, and the worker counts as given up.
+    /// Runs in the worker, whose standard output and error are its files. An exception is reported
+    /// there, and the worker counts as having given up.
     using Work = std::function<ExitStatus(std::size_t piece, const WorkerFiles& files)>;
     struct Outcome {
         ExitStatus status = kExitFailure;
-        /// An exception left the work: what follows it would not have been begun.
+        /// The work has thrown: serially, the following pieces would not have been started.
         bool gaveUp = false;
         /// The signal that ended the worker, or 0.
         int signal = 0;
     };
-    /// Done here; false ends the pieces that follow. Its exceptions leave.
+    /// Runs in this process; false stops the following pieces. Exceptions propagate.
     using Collect =
         std::function<bool(std::size_t piece, const Outcome& outcome, const WorkerFiles& files)>;
 
-    /// Done here a few times a second while workers are waited for.
+    /// Runs in this process several times a second while it waits for workers.
     using Meanwhile = std::function<void()>;
 
     OrderedWorkers(std::size_t pieces, unsigned jobs, Work work, Meanwhile meanwhile = {})
         : _pieces(pieces), _jobs(jobs), _work(std::move(work)), _meanwhile(std::move(meanwhile)) {}
-    /// Ends the workers that are left.
+    /// Ends the remaining workers.
     ~OrderedWorkers();
     OrderedWorkers(const OrderedWorkers&) = delete;
     OrderedWorkers& operator=(const OrderedWorkers&) = delete;
 
-    /// Why no further worker could be started, if so; everything before has been collected.
+    /// Nothing, or why no further worker could be started; all earlier ones have been collected.
     std::optional<HostError> run(const Collect& collect);
 
 private:
     struct Worker {
         pid_t process = -1;
         WorkerFiles files;
-        std::optional<Outcome> outcome; ///< once it has ended
+        std::optional<Outcome> outcome; ///< set once it has ended
     };
 
     std::size_t running() const;
@@ -77,7 +77,7 @@ private:
     unsigned _jobs;
     Work _work;
     Meanwhile _meanwhile;
-    std::deque<Worker> _workers; ///< those not collected, in order
+    std::deque<Worker> _workers; ///< not yet collected, in order
     std::size_t _started = 0;
 };
 

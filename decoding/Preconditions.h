@@ -9,12 +9,12 @@
 #include <string>
 #include <string_view>
 
-/// What must hold before a recording is worth reading; each a sentence when it does not.
+/// Checks before a recording is read; each returns a sentence if it fails.
 namespace pallax {
 
 std::string noGeneratorSentence(std::string_view recording, std::string_view technology);
 
-/// Nothing when one of `technologies` is that of the recording, or when its link type tells none.
+/// Nothing if the recording's technology is one of `technologies`, or its link type is unknown.
 std::optional<std::string> missingGenerator(const Recording& recording,
                                             std::span<const Technology> technologies);
 

@@ -15,15 +15,16 @@
 
 namespace pallax {
 
-/// What decoding needs besides a recording. All of it outlives the decoder.
+/// The dependencies of decoding besides a recording. All must outlive the decoder.
 struct DecoderEnvironment {
     const Resources& resources;
     const Bundle& bundle;
-    StandardOutput& standardOutput; ///< the generators' notices, which are no part of a display
+    StandardOutput& standardOutput; ///< for the generators' notices, which are not part of a
+                                    ///< display
     std::span<const Technology> technologies;
 };
 
-/// The clock of a recording: it stands at its latest packet or tick. Its zone is UTC.
+/// The clock of a recording: shows the time of its latest packet or tick. Its zone is UTC.
 class PacketClock final : public Clock {
 public:
     Time now() const override { return _now; }
@@ -34,13 +35,13 @@ private:
     Time _now;
 };
 
-/// Decodes the packets of one recording by driving its generator directly. Its display ticks lie
-/// on the grid of a viewer's, but it sees every packet of the recording, a viewer only those that
-/// its start command asked for. What it keeps does not grow with the recording.
+/// Decodes the packets of one recording by driving its generator directly. Its display ticks are on
+/// the same grid as a viewer's, but it sees every packet of the recording, a viewer only those that
+/// its start command requested. Its memory does not grow with the recording.
 class RecordingDecoder {
 public:
-    /// Packet bytes after which the display is generated although no tick has passed, for a
-    /// generator keeps what it has received since the previous time.
+    /// The number of packet bytes after which the display is generated even without a tick, because
+    /// a generator keeps what it has received since the last time.
     static constexpr std::size_t kMostUnseenBytes = std::size_t{1} << 20U;
 
     RecordingDecoder(const DecoderEnvironment& environment, std::string_view technology,
@@ -49,14 +50,13 @@ public:
     /// False when no generator knows the technology; then there is nothing else to do.
     bool hasGenerator() const { return _driver.generator() != nullptr; }
 
-    /// The reason why the packet was dropped, when a record has thrown; else nothing.
-    /// TemplateFailure leaves.
+    /// If a record has thrown, the reason why the packet was dropped. TemplateFailure propagates.
     std::optional<std::string> add(const RecordedPacket& packet);
-    /// The last tick, and with Every::End the display.
+    /// Produces the last tick and, with Every::End, the display.
     void finish();
 
     std::uint64_t packets() const { return _packets; }
-    /// How the latest packet's stamp stepped, if it did.
+    /// The step of the latest packet's stamp, if any.
     const std::optional<StampRemark>& step() const { return _grid.step(); }
 
 private:

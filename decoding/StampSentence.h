@@ -6,13 +6,13 @@
 #include <string>
 #include <string_view>
 
-/// The sentence that reports an odd stamp.
+/// Sentences that report an odd stamp.
 namespace pallax {
 
 /// "drive.pcap: no packets for 3600.0 s before packet 18."
 std::string stampSentence(std::string_view source, std::uint64_t packet, const StampRemark& remark);
 
-/// "No packets for 3600.0 s before packet 18": as short as a status line needs it.
+/// "No packets for 3600.0 s before packet 18": short enough for a status line.
 std::string stampNote(std::uint64_t packet, const StampRemark& remark);
 
 } // namespace pallax

@@ -10,12 +10,11 @@
 
 namespace pallax {
 
-/// The display ticks of a recording: tick n (from 1) stands n intervals after the first packet. A
-/// gap of years costs as much as one of seconds.
+/// The display ticks of a recording: tick n (from 1) is n intervals after the first packet. A gap
+/// of years costs no more than one of seconds.
 ///
-/// Where the stamps step back, the stretch of time that ends there gets the tick that follows its
-/// last packet. The next stretch has a grid of its own, from its first packet on; the numbers go
-/// on.
+/// When the stamps step back, the stretch of time that ends gets the tick after its last packet.
+/// The next stretch has its own grid, starting at its first packet; the tick numbers continue.
 class TickGrid {
 public:
     static constexpr std::chrono::nanoseconds kInterval = PallaxModel::kDisplayInterval;
@@ -25,15 +24,15 @@ public:
         Time time;
     };
 
-    /// A packet of that time comes next. The first tick that passes before it, if any does; of
-    /// several only this one can see new data, the others just count. A packet at a tick's very
-    /// time comes after it.
+    /// The next packet has this time. Returns the first tick that passes before it, if any; of
+    /// several, only this one can show new data, the others just count. A packet at exactly a
+    /// tick's time comes after it.
     std::optional<Tick> passedBefore(Time packet);
 
-    /// The tick that follows whatever came last. Only after a packet.
+    /// The tick after the last packet or tick. Only valid after a packet.
     Tick next() const;
 
-    /// How the latest packet's stamp stepped, if it did.
+    /// The step of the latest packet's stamp, if any.
     const std::optional<StampRemark>& step() const { return _step; }
 
 private:
@@ -41,8 +40,8 @@ private:
 
     StampSequence _stamps;
     std::optional<StampRemark> _step;
-    std::uint64_t _passed = 0;       // of the present stretch
-    std::uint64_t _passedBefore = 0; // of the stretches before
+    std::uint64_t _passed = 0;       // in the current stretch
+    std::uint64_t _passedBefore = 0; // in earlier stretches
 };
 
 } // namespace pallax

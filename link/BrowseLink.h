@@ -19,16 +19,16 @@ namespace pallax {
 class ChildService;
 class StandardOutput;
 
-/// What a model needs of this machine to browse: the main queue, the ports to the telephony
-/// service (a child's or the machine's), the source's clock, and the templates.
+/// The parts of this machine that a model needs to browse: the main queue, the ports to the
+/// telephony service (a child's or the machine's), the source's clock, and the templates.
 class BrowseLink {
 public:
-    /// How often a browser looks at the connection, and whether the child service is still there.
+    /// How often a browser checks the connection, and whether the child service is still running.
     static constexpr std::chrono::milliseconds kLookInterval{500};
 
-    /// `child` is null for the machine's own service; a child's clients get names of their own,
-    /// made of `localPortName`. Where that name is taken, the link has another for this process
-    /// (see LinkPorts). What is referred to outlives the link.
+    /// `child` is null for the machine's own service; a child's clients have private port names,
+    /// made from `localPortName`. If that name is taken, the link has another one for this process
+    /// (see LinkPorts). References must outlive the link.
     BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
                StandardOutput& notices, std::string_view localPortName = ModemLink::kLocalPortName);
 
@@ -40,7 +40,7 @@ public:
     const std::string& obstacle() const { return _linkPorts.obstacle(); }
 
     bool hasChild() const { return _child != nullptr; }
-    /// True once the child has ended; it is left to its owner to reap.
+    /// True once the child has ended; its owner must reap it.
     bool childHasEnded() const;
 
 private:

@@ -17,7 +17,7 @@ constexpr const char* kBusy = "The telephony service is busy with other clients"
 constexpr const char* kNothingToPlay = "The telephony service has nothing to play to this client";
 constexpr const char* kNoTechnology = "The modem tells no known technology";
 
-/// Why a request for a log channel gave none.
+/// Why a request for a log channel failed.
 std::string refusal(const LogChannel& channel) {
     if (channel.errorDomain == kPortErrorDomain) {
         return kNoAnswer;
@@ -42,7 +42,7 @@ std::string withoutFullStop(std::string sentence) {
 
 } // namespace
 
-/// Asks for the log channel of the real local port.
+/// Requests the log channel for the real local port.
 class LinkPorts::Connection final : public HXServerConnection {
 public:
     Connection(std::unique_ptr<HXServerConnection> connection, LinkPorts& link)

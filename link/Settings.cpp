@@ -33,7 +33,7 @@ std::optional<int> logLevelIn(std::string_view text) {
     return isWhole && level >= 0 && level <= kHighestLevel ? std::optional(level) : std::nullopt;
 }
 
-/// Takes one setting; the reason when it cannot.
+/// Sets one setting; returns the reason if it cannot.
 std::optional<std::string> take(Settings& settings, std::string_view key, std::string_view value) {
     if (key == "on-fatal-record") {
         if (value != "stop" && value != "skip") {

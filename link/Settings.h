@@ -12,11 +12,11 @@
 
 namespace pallax {
 
-/// What becomes of the display when the link to the modem was restarted.
+/// The fate of the display after a restart of the link to the modem.
 enum class AfterReconnect { Keep, Fresh };
 
-/// What the settings file says; without one, the defaults hold. Lines are `key = value`, empty,
-/// or a comment from "#" on its own line.
+/// The contents of the settings file; without one, the defaults. Lines are `key = value`, empty, or
+/// a comment from "#" on its own line.
 struct Settings {
     AfterReconnect afterReconnect = AfterReconnect::Keep; ///< after-reconnect = keep | fresh
     OnFatalRecord onFatalRecord = OnFatalRecord::Stop;    ///< on-fatal-record = stop | skip
@@ -25,7 +25,7 @@ struct Settings {
     int systemLogLevel = kSyslogLevel;                    ///< system-log-level = 0 ... 7
 };
 
-/// One clear sentence that names file and line.
+/// One sentence that names file and line.
 struct SettingsError {
     std::string sentence;
 };
@@ -36,11 +36,11 @@ using SettingsResult = Result<Settings, SettingsError>;
 
 SettingsResult parseSettings(std::string_view text, std::string_view file);
 
-/// Reads the first of the files that exists; the defaults when there is none. A file that cannot be
-/// looked at, is no regular file, or has more than kLargestSettings bytes is an error.
+/// Reads the first existing file; the defaults if there is none. A file that is inaccessible, not a
+/// regular file, or larger than kLargestSettings is an error.
 SettingsResult loadSettings(const std::vector<std::string>& files);
 
-/// Where settings are looked for: in the user's configuration folder ($XDG_CONFIG_HOME, else
+/// The paths of settings files: in the user's configuration folder ($XDG_CONFIG_HOME, else
 /// ~/.config), then in the system's.
 std::vector<std::string> settingsFiles();
 

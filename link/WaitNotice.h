@@ -9,8 +9,8 @@
 
 namespace pallax {
 
-/// Tells the user what a program without a connection waits for: once it has waited for a second,
-/// and again whenever that is something else.
+/// Tells the user why a program is not connected: after one second without a connection, and again
+/// whenever the reason changes.
 class WaitNotice {
 public:
     using SteadyNow = std::function<std::chrono::steady_clock::time_point()>;
@@ -20,26 +20,27 @@ public:
     struct Setup {
         TimerScheduler& timers;
         std::function<bool()> isConnected;
-        /// What is in the way, without a full stop; empty while that is not known.
+        /// The reason, without a full stop; empty while unknown.
         std::function<std::string()> obstacle;
-        /// Gets one sentence without its full stop, and an empty text once it no longer holds.
+        /// Receives one sentence without its full stop, and an empty text once it no longer
+        /// applies.
         std::function<void(const std::string& text)> say;
         SteadyNow steadyNow = std::chrono::steady_clock::now;
     };
 
-    /// The waiting begins now.
+    /// The wait starts now.
     explicit WaitNotice(Setup setup);
 
 private:
     void look();
 
     Setup _setup;
-    std::chrono::steady_clock::time_point _connected; ///< the latest look that found a connection
+    std::chrono::steady_clock::time_point _connected; ///< the latest check that found a connection
     std::string _told;
     std::unique_ptr<RepeatingTimer> _looks;
 };
 
-/// Says what a WaitNotice has to say on standard error.
+/// Prints the text of a WaitNotice on standard error.
 void complainOfWaiting(const std::string& text);
 
 } // namespace pallax

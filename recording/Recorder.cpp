@@ -16,7 +16,7 @@ namespace {
 
 constexpr std::chrono::seconds kProgressInterval{1};
 
-/// A name of its own, so that a viewer and other recorders may run at the same time.
+/// Unique, so that a viewer and other recorders can run at the same time.
 std::string localPortName() {
     return formatText("%@.Recorder.%d", {ModemLink::kLocalPortName, ::getpid()});
 }

@@ -20,20 +20,20 @@ namespace pallax {
 /// files instead of into a display, each with the stamp that the source sent.
 class Recorder final : private ModemLinkClient {
 public:
-    /// Gets, about once a second, how far it has come.
+    /// Receives the progress about once a second.
     using Progress = std::function<void(const std::string& text)>;
     /// How often it tries to connect.
     static constexpr std::chrono::milliseconds kRetryDelay{500};
 
-    /// `waits` hears what it waits for, as WaitNotice says it.
+    /// `waits` receives the texts of WaitNotice.
     Recorder(SocketDirectory directory, const RecordedTechnology* wanted, RecordingFiles& files,
              Progress progress, Progress waits);
 
-    /// Records until a signal, the end of the source or of whoever reads a pipe, or a failure:
-    /// nothing, or the failure's sentence.
+    /// Records until a signal, the end of the source, the loss of a pipe's reader, or a failure,
+    /// whose sentence it returns.
     std::optional<std::string> run();
 
-    /// The error's sentence, and how many packets are recorded all the same.
+    /// The error's sentence, and how many packets were recorded nevertheless.
     static std::string failureText(const HostError& error, const RecordingFiles& files);
     /// "120 packets, 4800 bytes, 50 packets/s", or that there is no modem yet.
     static std::string progressText(const RecordingFiles& files, std::uint64_t packetsPerSecond,
@@ -58,8 +58,8 @@ private:
     RecordingFiles& _files;
     Progress _progress;
     Progress _waits;
-    const RecordedTechnology* _technology = nullptr; // that the modem has answered
-    bool _isOver = false;                            // nothing more is written
+    const RecordedTechnology* _technology = nullptr; // the modem's answer
+    bool _isOver = false;                            // no more packets are written
     std::optional<std::string> _failure;
     std::uint64_t _packetsTold = 0;
     NoNotices _notices;

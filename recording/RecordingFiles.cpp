@@ -12,7 +12,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-/// What numbers can be put into: the name of a file, which may be there already.
+/// Whether the path can be numbered: it names a file or does not exist.
 bool namesFile(const std::string& path) {
     const std::string name = fs::path(path).filename().string();
     std::error_code error;
@@ -21,7 +21,7 @@ bool namesFile(const std::string& path) {
            (type == fs::file_type::regular || type == fs::file_type::not_found);
 }
 
-/// `number` as it is written stands before the extension.
+/// The path with `number` before the extension.
 std::string partOf(const std::string& path, const std::string& number) {
     const fs::path whole(path);
     const std::string name = whole.stem().string() + "-" + number + whole.extension().string();
@@ -55,7 +55,7 @@ std::optional<HostError> RecordingFiles::add(const RecordedTechnology& technolog
     if (auto error = makeRoom(technology, time, packet.size())) {
         return error;
     }
-    if (auto error = check()) { // before it is written, for that would hide what has been cut off
+    if (auto error = check()) { // before writing, which would hide that the file has been cut
         return error;
     }
     if (auto error = _file->write(time, packet)) {
@@ -78,7 +78,7 @@ std::optional<HostError> RecordingFiles::check() {
     return error;
 }
 
-/// Sees to a file of the technology that is not full.
+/// Provides a file of the technology with room for the packet.
 std::optional<HostError> RecordingFiles::makeRoom(const RecordedTechnology& technology, Time time,
                                                   std::size_t length) {
     const bool isOther = _technology != nullptr && _technology != &technology;
@@ -104,7 +104,7 @@ std::optional<HostError> RecordingFiles::makeRoom(const RecordedTechnology& tech
     return _file->begin(technology.linkType, technology.identifier);
 }
 
-/// A file that holds no packet yet takes the next one, whatever the limits are.
+/// A file without packets takes the next one, whatever the limits are.
 bool RecordingFiles::isFull(Time time, std::size_t length) const {
     if (_stamps.isEmpty()) {
         return false;
@@ -116,7 +116,7 @@ bool RecordingFiles::isFull(Time time, std::size_t length) const {
            (_options.rotateAfter && latest - _stamps.first() >= *_options.rotateAfter - _covered);
 }
 
-/// A number whose file exists is passed over rather than ending a recording that runs.
+/// Existing files are skipped, so that they do not end a running recording.
 std::optional<HostError> RecordingFiles::nextFile() {
     std::string path;
     std::error_code unknown;

@@ -14,46 +14,46 @@ namespace pallax {
 
 struct RecordedTechnology;
 
-/// The files of one recording run. Without a limit it is one file, of the given name. With a
-/// limit, a number stands before the name's extension ("drive.pcapng": "drive-0001.pcapng",
-/// "drive-0002.pcapng", …), and the next file begins where a packet would pass the limit.
+/// The files of one recording run. Without a limit there is one file with the given name. With a
+/// limit, the file names have a number before the extension ("drive.pcapng": "drive-0001.pcapng",
+/// "drive-0002.pcapng", …), and the next file starts when a packet would exceed the limit.
 ///
-/// A file holds one technology, for readers of captures refuse a second one. Where another comes,
-/// the next file begins; without a limit that is "drive-2.pcapng".
+/// A file holds one technology, because capture readers refuse a second one. Another technology
+/// starts the next file; without a limit that is "drive-2.pcapng".
 class RecordingFiles {
 public:
     struct Options {
-        std::string path; ///< "-" is standard output, which takes no limit
+        std::string path; ///< "-" is standard output, which accepts no limit
         PcapNgWriter::Existing existing = PcapNgWriter::Existing::Keep;
-        std::optional<std::uint64_t> rotateSize;             ///< bytes that a file may have
-        std::optional<std::chrono::nanoseconds> rotateAfter; ///< of the packets' own time
+        std::optional<std::uint64_t> rotateSize;             ///< maximum bytes of a file
+        std::optional<std::chrono::nanoseconds> rotateAfter; ///< in the packets' own time
 
         bool rotates() const { return rotateSize || rotateAfter; }
     };
-    /// Gets one sentence for the user.
+    /// Receives one sentence for the user.
     using Notice = std::function<void(const std::string& sentence)>;
 
-    /// As many names as sort in the order in which they are written.
+    /// The number of names that sort in the order of writing.
     static constexpr unsigned kMostParts = 9999;
 
-    /// Opens the first file; fails where it exists already and is to be kept, and where files
-    /// are to rotate but the path is no file. `notice` hears when a new technology begins a file.
+    /// Opens the first file. Fails if it exists and must be kept, or if files rotate but the path
+    /// is not a file. `notice` is told when a new technology starts a file.
     static Result<std::unique_ptr<RecordingFiles>, HostError> open(const Options& options,
                                                                    Notice notice = {});
 
-    /// Nothing when the packet is in the file; else why it is not, and recording is over. A packet
-    /// above PcapNgWriter::kLargestPacket is left out and counted.
+    /// Nothing if the packet is in the file; otherwise an error, and recording is over. A packet
+    /// above PcapNgWriter::kLargestPacket is omitted and counted.
     std::optional<HostError> add(const RecordedTechnology& technology, Time time, Bytes packet);
-    /// Nothing when the current file is still what was written; to be asked at the end too. An
+    /// Nothing if the current file has not been changed by others; call this at the end too. An
     /// error ends recording.
     std::optional<HostError> check();
 
-    /// Written, over all files; less those of a file that others have interfered with.
+    /// Packets written to all files, except to a file that others have changed.
     std::uint64_t packets() const { return _packets; }
     std::uint64_t bytes() const { return _bytes; } ///< of the packets themselves
     std::uint64_t tooLarge() const { return _tooLarge; }
 
-    /// The name of the file with that number.
+    /// The name of the file with this number.
     static std::string numberedPath(const std::string& path, unsigned number);
 
 private:
@@ -68,10 +68,10 @@ private:
     Options _options;
     Notice _notice;
     std::unique_ptr<PcapNgWriter> _file;
-    unsigned _number = 1;                            // of that file
+    unsigned _number = 1;                            // of the current file
     const RecordedTechnology* _technology = nullptr; // of its packets
     StampSequence _stamps;                           // of its packets
-    std::chrono::nanoseconds _covered{0}; // by its stretches of time before the present one
+    std::chrono::nanoseconds _covered{0};            // by the finished stretches of time
     std::uint64_t _packets = 0;
     std::uint64_t _bytes = 0;
     std::uint64_t _tooLarge = 0;
