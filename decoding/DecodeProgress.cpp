@@ -56,7 +56,7 @@ DecodeProgress::~DecodeProgress() {
 }
 
 void DecodeProgress::wipe() {
-    if (!_isWorker) { // unless forked while a line was shown
+    if (!_isWorker) { // a worker may be forked while a line is shown
         _line.wipe();
     }
 }
