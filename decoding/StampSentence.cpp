@@ -19,7 +19,7 @@ std::string stampSentence(std::string_view source, std::uint64_t packet,
     switch (remark.kind) {
     case StampRemark::Kind::StepBack:
         return formatText("%@: packet %llu is %.1f s earlier than the latest packet before it; "
-                          "ticks are counted anew from there.",
+                          "ticks are counted from there.",
                           {source, packet, secondsOf(remark)});
     case StampRemark::Kind::Gap:
         return formatText("%@: no packets for %.1f s before packet %llu.",
@@ -27,8 +27,8 @@ std::string stampSentence(std::string_view source, std::uint64_t packet,
     case StampRemark::Kind::OutOfRange:
         break;
     }
-    return formatText("%@: the stamp of packet %llu is no time from 1970 to 2255; the nearest one "
-                      "is taken for it and for others like it.",
+    return formatText("%@: the stamp of packet %llu is not between 1970 and 2255; the nearest time "
+                      "replaces it and others like it.",
                       {source, packet});
 }
 

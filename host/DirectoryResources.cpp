@@ -48,7 +48,7 @@ Result<PropertyList, HostError> DirectoryResources::load(std::string_view name) 
         return failed(parsed.error().text());
     }
     if (parsed->dictionary() == nullptr) {
-        return failed("it is no dictionary");
+        return failed("it is not a dictionary");
     }
     return std::move(parsed).value();
 }

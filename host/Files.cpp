@@ -37,7 +37,7 @@ Result<ByteBuffer, ReadFailure> readRegularFile(const std::string& path, std::si
     }
     if (!S_ISREG(status.st_mode)) {
         return ReadFailure{false,
-                           S_ISDIR(status.st_mode) ? "it is a folder" : "it is no regular file"};
+                           S_ISDIR(status.st_mode) ? "it is a folder" : "it is not a regular file"};
     }
     ByteBuffer content;
     constexpr std::size_t kPiece = std::size_t{64} << 10U;

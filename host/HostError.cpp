@@ -13,8 +13,8 @@ HostError unwritableRecording(std::string_view name, int error) {
 }
 
 HostError untakenRecording(std::string_view name, bool isWhole) {
-    return {formatText("The recording %@ ends in the middle of a packet, for its reader takes no "
-                       "more.",
+    return {formatText("The recording %@ ends in the middle of a packet because its reader has "
+                       "stopped reading.",
                        {name}),
             isWhole};
 }

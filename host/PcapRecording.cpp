@@ -68,7 +68,7 @@ RecordingError PcapRecording::foreignLinkType() const {
         known += formatText("%d (%@)", {technology.linkType, technology.commandName});
     }
     return errorOf(Kind::UnknownLinkType, _name,
-                   formatText("has the link type %d, which is no radio modem's; known are %@",
+                   formatText("has the link type %d, which is not a radio modem's; known are %@",
                               {_linkType, known}));
 }
 
@@ -107,7 +107,7 @@ std::optional<RecordedPacket> PcapRecording::next() {
         const bool cut = std::feof(pcap_file(_capture)) != 0;
         _error = cut ? errorOf(Kind::CutShort, _name, "ends in the middle of a packet")
                      : errorOf(Kind::Unreadable, _name,
-                               formatText("cannot be read on: %@", {pcap_geterr(_capture)}));
+                               formatText("cannot be read further: %@", {pcap_geterr(_capture)}));
     }
     _ended = true;
     return std::nullopt;
@@ -156,11 +156,10 @@ Result<OpenedFile, RecordingError> openFile(const Recording::Input& input,
 
 RecordingError noCapture(std::FILE* file, const std::string& name, std::string_view reason) {
     if (std::feof(file) != 0) {
-        return errorOf(Kind::NoCapture, name,
-                       "is no recording: it ends before the header of a capture is whole");
+        return errorOf(Kind::NoCapture, name, "is not a recording: it ends within its header");
     }
     if (reason.find("unknown file format") != std::string_view::npos) {
-        return errorOf(Kind::NoCapture, name, "is no recording: it is neither pcap nor pcapng");
+        return errorOf(Kind::NoCapture, name, "is not a recording: it is neither pcap nor pcapng");
     }
     return errorOf(Kind::Unreadable, name, formatText("cannot be read: %@", {reason}));
 }

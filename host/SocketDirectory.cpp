@@ -41,13 +41,13 @@ Result<SocketDirectory, HostError> SocketDirectory::open() {
     }
     struct stat status {};
     if (::lstat(path.c_str(), &status) != 0) {
-        return refusal(path, formatText("cannot be looked at: %@", {std::strerror(errno)}));
+        return refusal(path, formatText("cannot be accessed: %@", {std::strerror(errno)}));
     }
     if (S_ISLNK(status.st_mode)) {
         return refusal(path, "is a symbolic link");
     }
     if (!S_ISDIR(status.st_mode)) {
-        return refusal(path, "is no folder");
+        return refusal(path, "is not a folder");
     }
     if (status.st_uid != ::geteuid()) {
         return refusal(path, "belongs to another user");
@@ -65,7 +65,7 @@ Result<std::string, HostError> SocketDirectory::socketPath(std::string_view name
     const std::string file = fileNameFor(name);
     if (file.size() > longestSocketName()) {
         return HostError{formatText("The name of the message port %@ is too long: its socket's "
-                                    "name would have %zu bytes, and %zu is the most.",
+                                    "name would have %zu bytes; the limit is %zu.",
                                     {name, file.size(), longestSocketName()})};
     }
     return _path + "/" + file;

@@ -15,7 +15,7 @@ constexpr const char* kNoService = "No telephony service is running";
 constexpr const char* kNoAnswer = "The telephony service does not answer";
 constexpr const char* kBusy = "The telephony service is busy with other clients";
 constexpr const char* kNothingToPlay = "The telephony service has nothing to play to this client";
-constexpr const char* kNoTechnology = "The modem tells no known technology";
+constexpr const char* kNoTechnology = "The modem's technology is unknown";
 
 /// Why a request for a log channel failed.
 std::string refusal(const LogChannel& channel) {
@@ -28,7 +28,7 @@ std::string refusal(const LogChannel& channel) {
     case EIO:
         return kNothingToPlay;
     default:
-        return formatText("The telephony service gives no log channel: %@",
+        return formatText("The telephony service refuses a log channel: %@",
                           {std::strerror(channel.errorCode)}); // NOLINT(concurrency-mt-unsafe)
     }
 }

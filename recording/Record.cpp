@@ -56,7 +56,7 @@ ExitStatus record(const RecordOptions& options) {
         failure = Recorder::failureText(*error, **files);
     }
     if ((*files)->tooLarge() > 0) {
-        complain(formatText("%llu packets of more than %zu bytes were left out.",
+        complain(formatText("%llu packets of more than %zu bytes were omitted.",
                             {(*files)->tooLarge(), PcapNgWriter::kLargestPacket}));
     }
     if (failure) {

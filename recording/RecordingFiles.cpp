@@ -95,7 +95,7 @@ std::optional<HostError> RecordingFiles::makeRoom(const RecordedTechnology& tech
         }
     }
     if (isOther && _notice) {
-        _notice(formatText("%@; recording goes on in %@.", {now(), _file->name()}));
+        _notice(formatText("%@; recording continues in %@.", {now(), _file->name()}));
     }
     if (_technology != nullptr) {
         return std::nullopt;

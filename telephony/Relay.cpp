@@ -144,7 +144,7 @@ void Relay::step() {
 void Relay::handOn(const PacketSource::Packet& packet) {
     const auto now = _setup.steadyNow();
     if (std::exchange(_stalled, false)) {
-        _setup.report(formatText("The stream goes on after %lld s.",
+        _setup.report(formatText("The stream continues after %lld s.",
                                  {std::chrono::floor<std::chrono::seconds>(now - _heard).count()}));
     }
     _heard = now;

@@ -98,7 +98,7 @@ Result<ServiceStatus, HostError> askStatus(SocketMessagePorts& ports,
     const auto message = outcome.reply ? decodeMessage(*outcome.reply) : std::nullopt;
     const auto status = message ? parseStatusReply(*message) : std::nullopt;
     if (!status) {
-        return HostError{"The telephony service does not tell its status."};
+        return HostError{"The telephony service does not report its status."};
     }
     return *status;
 }

@@ -61,7 +61,7 @@ StreamOpening::Opened openStream(const StreamOpening& opening) {
     const bool hasStalled = watch.end();
     if (hasStalled && opened) {
         opening.report(
-            formatText("The stream goes on after %lld s.",
+            formatText("The stream continues after %lld s.",
                        {std::chrono::floor<std::chrono::seconds>(Clock::now() - begun).count()}));
     }
     return opened;

@@ -78,14 +78,14 @@ TEST_F(EndToEndSteps, TheTicksOfDecodeAndOfTheViewerAreTheSameAndBothTellOfTheSt
         "2023-11-14 22:14:12 REG_STATE_REGISTERING"};
     const std::string told = "pallax: " + recording +
                              ": packet 4 is 7204.9 s earlier than the latest packet before it; "
-                             "ticks are counted anew from there.\n"
+                             "ticks are counted from there.\n"
                              "pallax: " +
                              recording +
                              ": no packets for 62.9 s before packet 8.\n"
                              "pallax: " +
                              recording +
                              ": packet 10 is 15.1 s earlier than the latest packet before it; "
-                             "ticks are counted anew from there.\n";
+                             "ticks are counted from there.\n";
     EXPECT_EQ(decodedTicks(recording), expected);
     const Run decoded = run({"decode", recording});
     EXPECT_EQ(decoded.status, 0);
@@ -105,7 +105,7 @@ TEST_F(EndToEndSteps, AStepAtAPacketThatTheViewerDoesNotAskForIsOneToo) {
     const Run played = run({recording, "--print", "--speed", "max"});
     EXPECT_EQ(played.err, "pallax: " + recording +
                               ": packet 3 is 10.0 s earlier than the latest packet before it; "
-                              "ticks are counted anew from there.\n");
+                              "ticks are counted from there.\n");
     EXPECT_EQ(played.err, run({"decode", recording}).err);
     EXPECT_EQ(printedTicks(played.out), (Lines{"2023-11-14 22:15:02 REG_STATE_INACTIVE",
                                                "2023-11-14 22:15:01 REG_STATE_REGISTERING",
@@ -148,8 +148,8 @@ TEST_F(EndToEndSteps, SecondsAfter2038AndStampsThatAreNoTimesAreTheSameInDecodeA
     bytes.replace(kSecondsAt + 4, 4, "\xFF\xFF\xFF\x7F");
     std::ofstream(recording, std::ios::binary) << bytes;
     const std::string told = "pallax: " + recording +
-                             ": the stamp of packet 1 is no time from 1970 to 2255; the nearest "
-                             "one is taken for it and for others like it.\n";
+                             ": the stamp of packet 1 is not between 1970 and 2255; the nearest "
+                             "time replaces it and others like it.\n";
     EXPECT_EQ(run({"decode", recording}).err, told);
     EXPECT_EQ(run({recording, "--print", "--speed", "max"}).err, told);
 }

@@ -89,7 +89,7 @@ TEST_F(EndToEndExit, OfUnreadableSettingsIsOneSentence) {
         const Run result = run(arguments);
         EXPECT_EQ(result.status, 1);
         EXPECT_EQ(result.out, "");
-        EXPECT_EQ(result.err, "pallax: " + file + " cannot be read: it is no regular file.\n");
+        EXPECT_EQ(result.err, "pallax: " + file + " cannot be read: it is not a regular file.\n");
     }
     std::filesystem::remove(file);
     EXPECT_EQ(run({brief(), "--print", "--speed", "max"}).status, 0) << "one that is missing";

@@ -171,7 +171,7 @@ TEST_F(EndToEndRecordFiles, HoldOneTechnologyEach) {
     EXPECT_EQ(recorder.wait(), 0);
     EXPECT_EQ(rotating.wait(), 0);
     const std::string sentence =
-        "pallax: The modem now speaks Zorell_LTE (lte); recording goes on in ";
+        "pallax: The modem now speaks Zorell_LTE (lte); recording continues in ";
     EXPECT_EQ(recorder.err(), sentence + second + ".\n");
     EXPECT_EQ(rotating.err(), sentence + secondRotated + ".\n");
     for (const std::string& path : {file, second, secondRotated, piped}) {

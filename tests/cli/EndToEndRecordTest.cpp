@@ -232,8 +232,8 @@ TEST_F(EndToEndRecord, AfterAKilledServiceItGoesOnInTheSameFile) {
     EXPECT_GT(static_cast<int>(times.size()), before + 10);
     EXPECT_EQ(std::count(times.begin(), times.end(), "2023-11-14T22:13:20.000Z"), 2);
     EXPECT_TRUE(decoded.err.starts_with("pallax: " + file + ": packet ")) << decoded.err;
-    EXPECT_TRUE(decoded.err.ends_with(" s earlier than the latest packet before it; ticks are "
-                                      "counted anew from there.\n"))
+    EXPECT_TRUE(decoded.err.ends_with(
+        " s earlier than the latest packet before it; ticks are counted from there.\n"))
         << decoded.err;
 }
 

@@ -208,7 +208,8 @@ TEST_F(EndToEndRelay, AStreamThatTurnsToGarbageIsAFailure) {
     sendBytes(std::string(4096, '\xEE'));
     EXPECT_EQ(service->wait(), 1) << "without the writer's end";
     const std::string complaint = service->err();
-    EXPECT_TRUE(complaint.starts_with("pallax: standard input cannot be read on: ")) << complaint;
+    EXPECT_TRUE(complaint.starts_with("pallax: standard input cannot be read further: "))
+        << complaint;
     EXPECT_TRUE(complaint.ends_with(". 1 packets were relayed.\n")) << complaint;
     EXPECT_EQ(recorder.wait(), 0);
     EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
@@ -238,7 +239,7 @@ TEST_F(EndToEndRelayBegins, AStreamWhoseHeaderDoesNotComeHasStalledAndMayGoOn) {
     auto writer = RecordingWriter::create(pipe, kGsmLinkType);
     ASSERT_TRUE(writer);
     auto device = std::move(writer).value();
-    EXPECT_TRUE(says("pallax: The stream goes on after 1"));
+    EXPECT_TRUE(says("pallax: The stream continues after 1"));
     EXPECT_TRUE(eventually([this] { return !world.sockets().empty(); }));
     EXPECT_EQ(device->write(kSampleStart, registration(0)), std::nullopt);
     device.reset();
@@ -256,7 +257,7 @@ TEST_F(EndToEndRelayBegins, AStreamThatEndsBeforeItsHeaderOrIsNoneIsAFailure) {
     const Run garbage = run({"service", "--relay", "-"}, world.path("garbage"));
     EXPECT_EQ(garbage.status, 1);
     EXPECT_EQ(garbage.err,
-              "pallax: standard input is no recording: it is neither pcap nor pcapng.\n");
+              "pallax: standard input is not a recording: it is neither pcap nor pcapng.\n");
 }
 
 TEST_F(EndToEndRelay, TheStatusTellsWhatRuns) {

@@ -146,7 +146,8 @@ TEST_F(EndToEndStream, ThatIsNoRecordingIsNamed) {
     feed(world.path("config/pallax/pallax.conf"));
     const Run result = run({"--print", pipe});
     EXPECT_EQ(result.status, 1);
-    EXPECT_EQ(result.err, "pallax: " + pipe + " is no recording: it is neither pcap nor pcapng.\n");
+    EXPECT_EQ(result.err,
+              "pallax: " + pipe + " is not a recording: it is neither pcap nor pcapng.\n");
 }
 
 TEST_F(EndToEndStream, CannotBeginAgain) {

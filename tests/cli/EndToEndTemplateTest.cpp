@@ -72,7 +72,7 @@ TEST_F(EndToEndTemplate, ThatCannotBeReadIsOneSentenceAndFailure) {
     fs::remove(file("ZOR_GSM.plist"));
     std::ofstream(file("ZOR_GSM.plist")) << "( a, b )";
     isRefusedEverywhere(sample("gsm-attach.pcap"),
-                        unloadable("ZOR_GSM.plist", "it is no dictionary"));
+                        unloadable("ZOR_GSM.plist", "it is not a dictionary"));
 }
 
 TEST_F(EndToEndTemplate, IsNotAskedForByIfxNorByARecorder) {

@@ -151,8 +151,8 @@ TEST_F(EndToEndTerminal, ADumbTerminalGetsThePrintedTree) {
 
 TEST_F(EndToEndTerminal, ATerminalTypeThatNobodyKnowsGivesOneSentence) {
     PallaxTerminal terminal(world, {brief()}, {.type = "no-such-terminal"});
-    EXPECT_TRUE(terminal.shows("pallax: Nothing is known here of the terminal type "
-                               "\"no-such-terminal\" (TERM); --\nprint does without.\n"));
+    EXPECT_TRUE(terminal.shows("pallax: The terminal type \"no-such-terminal\" (TERM) is unknown; "
+                               "--print needs no\n terminal.\n"));
     EXPECT_EQ(terminal.wait(), 1);
 }
 

@@ -213,7 +213,7 @@ TEST_F(HostFilesTest, AResourceThatCannotBeLoadedIsNamedWithTheReason) {
     (void)_folder.write("cut.plist", "<plist version=\"1.0\"><dict>");
     EXPECT_EQ(reasonOf("cut"), "at byte 26: malformed XML: Start-end tags mismatch.");
     (void)_folder.write("list.plist", "( a, b )");
-    EXPECT_EQ(reasonOf("list"), "it is no dictionary.");
+    EXPECT_EQ(reasonOf("list"), "it is not a dictionary.");
     (void)_folder.write("good.plist", "{ a = b; }");
     EXPECT_EQ(*resources.load("good"), PropertyList(Dictionary{{"a", "b"}}));
     EXPECT_EQ(DirectoryResources("/nonexistent").list().error().sentence,
@@ -253,8 +253,8 @@ TEST_F(HostFilesTest, OnlyARegularFileIsReadAndNoPipeIsWaitedFor) {
         const ReadFailure failure = content ? ReadFailure() : content.error();
         return (failure.isMissing ? "missing: " : "") + failure.reason;
     };
-    EXPECT_EQ(failureFor(pipe), "it is no regular file");
-    EXPECT_EQ(failureFor("/dev/zero"), "it is no regular file");
+    EXPECT_EQ(failureFor(pipe), "it is not a regular file");
+    EXPECT_EQ(failureFor("/dev/zero"), "it is not a regular file");
     EXPECT_EQ(failureFor(_folder.path()), "it is a folder");
     EXPECT_EQ(failureFor(_folder.write("f", "12345")), "it has more than 4 bytes");
     EXPECT_EQ(failureFor(_folder.write("f", "1234")), "");

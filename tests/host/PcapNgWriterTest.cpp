@@ -299,8 +299,8 @@ TEST_F(PcapNgWriterToAStalledPipe, EndsQuietlyBehindAWholePacket) {
 TEST_F(PcapNgWriterToAStalledPipe, TellsOfAPacketThatWasTakenInPart) {
     const HostError error = errorOfPackets(10'000);
     EXPECT_FALSE(error.readerHasGone);
-    EXPECT_EQ(error.sentence, "The recording standard output ends in the middle of a packet, for "
-                              "its reader takes no more.");
+    EXPECT_EQ(error.sentence, "The recording standard output ends in the middle of a packet "
+                              "because its reader has stopped reading.");
 }
 
 } // namespace

@@ -206,8 +206,7 @@ TEST_F(RecordingTest, ACutHeaderIsNoCapture) {
     for (const std::size_t length : {1U, 3U, 4U, 10U, 23U}) {
         const auto error = failure(pcap(kMicroseconds).substr(0, length));
         EXPECT_EQ(error.kind, Kind::NoCapture);
-        EXPECT_EQ(error.sentence,
-                  named("is no recording: it ends before the header of a capture is whole"));
+        EXPECT_EQ(error.sentence, named("is not a recording: it ends within its header"));
     }
 }
 
@@ -219,7 +218,7 @@ TEST_F(RecordingTest, ZeroBytesAreEmpty) {
 TEST_F(RecordingTest, AnythingElseIsNoCapture) {
     const auto error = failure("{\"this\": \"is some other file\"}");
     EXPECT_EQ(error.kind, Kind::NoCapture);
-    EXPECT_EQ(error.sentence, named("is no recording: it is neither pcap nor pcapng"));
+    EXPECT_EQ(error.sentence, named("is not a recording: it is neither pcap nor pcapng"));
 }
 
 TEST_F(RecordingTest, ACaptureWithoutPacketsIsNoError) {
@@ -237,8 +236,9 @@ TEST_F(RecordingTest, AnImpossiblePacketLengthCannotBeReadOn) {
     EXPECT_FALSE(recording->next());
     ASSERT_TRUE(recording->error());
     EXPECT_EQ(recording->error()->kind, Kind::Unreadable);
-    EXPECT_EQ(recording->error()->sentence.find(_folder.file("r.pcap") + " cannot be read on: "),
-              0U);
+    EXPECT_EQ(
+        recording->error()->sentence.find(_folder.file("r.pcap") + " cannot be read further: "),
+        0U);
 }
 
 TEST_F(RecordingTest, WhatCannotBeOpenedSaysWhy) {
@@ -261,7 +261,7 @@ TEST_F(RecordingTest, AForeignLinkTypeOpensAndIsNamed) {
     const auto error = recording->foreignLinkType();
     EXPECT_EQ(error.kind, Kind::UnknownLinkType);
     EXPECT_EQ(error.sentence,
-              named("has the link type 1, which is no radio modem's; known are 147 (ifx), 148 "
+              named("has the link type 1, which is not a radio modem's; known are 147 (ifx), 148 "
                     "(gsm), 149 (cdma), 150 (lte) and 151 (utran)"));
 }
 

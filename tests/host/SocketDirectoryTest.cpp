@@ -50,7 +50,7 @@ TEST_F(SocketDirectoryTest, ASymbolicLinkIsRefused) {
 
 TEST_F(SocketDirectoryTest, AFileInItsPlaceIsRefused) {
     _folder.write("pallax", "x");
-    EXPECT_EQ(refusal(), sentence("is no folder"));
+    EXPECT_EQ(refusal(), sentence("is not a folder"));
 }
 
 TEST_F(SocketDirectoryTest, AMissingParentIsRefused) {
@@ -96,7 +96,7 @@ TEST_F(SocketDirectoryTest, ANameTooLongForASocketIsAnError) {
     const std::string name(83, 'a');
     EXPECT_EQ(directory->socketPath(name).error().sentence,
               "The name of the message port " + name +
-                  " is too long: its socket's name would have 83 bytes, and 82 is the most.");
+                  " is too long: its socket's name would have 83 bytes; the limit is 82.");
 }
 
 TEST_F(SocketDirectoryTest, ALockThatAnotherKeepsIsWaitedForOnlyForAWhile) {

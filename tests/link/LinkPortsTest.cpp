@@ -129,7 +129,7 @@ TEST_F(LinkPortsTest, WhatAStartHasFailedAtIsRemembered) {
 
     reply = {SendError::ReplyTimedOut, std::nullopt};
     (void)failedStart();
-    EXPECT_EQ(_link.obstacle(), "The modem tells no known technology");
+    EXPECT_EQ(_link.obstacle(), "The modem's technology is unknown");
 }
 
 TEST_F(LinkPortsTest, WhyTheServiceGivesNoLogChannelIsToldInWords) {
@@ -143,7 +143,7 @@ TEST_F(LinkPortsTest, WhyTheServiceGivesNoLogChannelIsToldInWords) {
     EXPECT_EQ(obstacle(kServiceErrorDomain, EIO),
               "The telephony service has nothing to play to this client");
     EXPECT_EQ(obstacle(kServiceErrorDomain, ECONNREFUSED),
-              "The telephony service gives no log channel: Connection refused");
+              "The telephony service refuses a log channel: Connection refused");
     EXPECT_EQ(obstacle(kPortErrorDomain, 2), "The telephony service does not answer");
 }
 

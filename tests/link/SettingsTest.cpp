@@ -90,7 +90,7 @@ TEST_F(SettingsFileTest, ANamedPipeIsRefusedWithoutWaitingForIt) {
     ASSERT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
     const auto settings = loadSettings({pipe});
     ASSERT_FALSE(settings);
-    EXPECT_EQ(settings.error().sentence, pipe + " cannot be read: it is no regular file.");
+    EXPECT_EQ(settings.error().sentence, pipe + " cannot be read: it is not a regular file.");
 }
 
 TEST_F(SettingsFileTest, AMebibyteIsTheMost) {

@@ -170,9 +170,9 @@ TEST_F(RecordingFilesTest, AnotherTechnologyBeginsAnotherFileAndThatIsTold) {
         ASSERT_EQ(add(**files, seconds(0)), std::nullopt) << name;
     }
     EXPECT_EQ(notices, (std::vector<std::string>{
-                           "The modem now speaks Zorell_GSM (gsm); recording goes on in " +
+                           "The modem now speaks Zorell_GSM (gsm); recording continues in " +
                                folder.file("drive-2.pcapng") + ".",
-                           "The modem now speaks Zorell_LTE (lte); recording goes on in " +
+                           "The modem now speaks Zorell_LTE (lte); recording continues in " +
                                folder.file("drive-4.pcapng") + "."}));
     EXPECT_EQ(packetsIn("drive.pcapng"), 1);
     EXPECT_EQ(packetsIn("drive-2.pcapng"), 2);

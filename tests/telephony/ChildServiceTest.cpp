@@ -96,7 +96,7 @@ TEST_F(ChildServiceTest, AFailureIsTheChildsOwnSentence) {
     EXPECT_EQ(failure(_folder.file("absent")),
               _folder.file("absent") + " cannot be opened: No such file or directory.");
     EXPECT_EQ(failure(_folder.write("text", "no capture at all, but a text")),
-              _folder.file("text") + " is no recording: it is neither pcap nor pcapng.");
+              _folder.file("text") + " is not a recording: it is neither pcap nor pcapng.");
     EXPECT_EQ(::waitpid(-1, nullptr, WNOHANG), -1);
 }
 

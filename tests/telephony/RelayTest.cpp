@@ -147,7 +147,7 @@ TEST_F(RelayTest, AStallIsReportedOnceAndWhenItIsOver) {
     _tap->give({2});
     _tap->give({3});
     EXPECT_EQ(_reports, (Reports{"The stream has stalled: no packet for 10 s.",
-                                 "The stream goes on after 39 s."}));
+                                 "The stream continues after 39 s."}));
     EXPECT_EQ(_ends, std::vector<bool>());
 }
 

@@ -52,7 +52,7 @@ TEST(StreamOpening, AStallBeforeTheHeaderIsReportedAndItsEnd) {
                                     2ms});
     EXPECT_TRUE(opened);
     EXPECT_EQ(told, (Sentences{"The stream has stalled: no header for 0 s.",
-                               "The stream goes on after 0 s."}));
+                               "The stream continues after 0 s."}));
 }
 
 TEST(StreamOpening, AStreamThatEndsWithoutAHeaderAfterAStallIsAFailureAndDoesNotGoOn) {

@@ -163,15 +163,14 @@ CursesTerminal::open(const Options& options) {
     }
     impl->input.reset(std::fopen(kControllingTerminal, "re"));
     if (!impl->input) {
-        return TerminalError{"There is no terminal to take keys from; --print does without."};
+        return TerminalError{"There is no terminal to read keys from; --print needs none."};
     }
     impl->restorer = std::make_unique<TerminalRestorer>(STDOUT_FILENO);
     impl->screen = ::newterm(nullptr, stdout, impl->input.get());
     if (impl->screen == nullptr) {
         const char* type = std::getenv("TERM");
-        return TerminalError{"Nothing is known here of the terminal type \"" +
-                             std::string(type == nullptr ? "" : type) +
-                             "\" (TERM); --print does without."};
+        return TerminalError{"The terminal type \"" + std::string(type == nullptr ? "" : type) +
+                             "\" (TERM) is unknown; --print needs no terminal."};
     }
     impl->restorer->setSequence(restoringSequence());
     ::cbreak();
