@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// What the messages of an IFX modem hold. They are objects that describe themselves, and the
-/// display is whatever comes; these are the sections and keys that are known to come.
+/// The messages of an IFX modem. Each is an object that becomes the display unchanged; these are
+/// its known sections and keys.
 std::vector<SectionReference> ifxSections();
 
 } // namespace pallax

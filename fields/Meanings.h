@@ -10,12 +10,12 @@ namespace pallax {
 /// What a display key tells whose layout does not say it, in one sentence; with an empty key, what
 /// its section tells. The keys of a list within a section belong to the section, too.
 struct Meaning {
-    std::string_view section; ///< of CDMA: the path in the template, "1x / Receiver 0"
+    std::string_view section; ///< for CDMA: the path in the template, "1x / Receiver 0"
     std::string_view key;
     std::string_view sentence;
 };
 
-/// What a log code is called.
+/// The name of a log code.
 struct CodeName {
     LogCode logCode;
     std::string_view name;
@@ -27,7 +27,7 @@ struct Meanings {
 };
 
 Meanings cdmaMeanings();
-/// Of the sections and codes that several technologies have.
+/// For sections and codes of several technologies.
 Meanings commonMeanings();
 Meanings gsmMeanings();
 Meanings ifxMeanings();

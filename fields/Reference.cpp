@@ -19,7 +19,7 @@ namespace pallax {
 
 namespace {
 
-/// A class index prints that it ends; nobody wants to know here.
+/// Discards the notices that class indexes print on destruction.
 class NoOutput final : public StandardOutput {
 public:
     void printLine(std::string_view /*line*/) override {}
@@ -84,10 +84,10 @@ std::vector<SectionReference> utranSections(const Resources& resources) {
     return recordSections<UTRANClassIndex>(resources, "UTRAN");
 }
 
-/// Lookup name to the keys of one section that show it.
+/// Maps a lookup name to the keys of one section that show it.
 using Places = std::multimap<std::string, std::string>;
 
-/// Those that the section shows, under its keys.
+/// The described items that the section shows, under its keys.
 template <class Described>
 std::vector<Described> shownIn(const Places& places, const std::vector<Described>& all) {
     std::vector<Described> shown;
@@ -101,7 +101,7 @@ std::vector<Described> shownIn(const Places& places, const std::vector<Described
     return shown;
 }
 
-/// What of a code the section shows; nothing when that is nothing.
+/// The part of a code that the section shows, if any.
 std::optional<CodeDescription> shownIn(const Places& places, const CodeDescription& code) {
     CodeDescription shown = code;
     shown.fields = shownIn(places, code.fields);

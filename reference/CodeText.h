@@ -5,8 +5,8 @@
 #include <string>
 #include <vector>
 
-/// What documents say about a section, in words and rows: the same for the manual page and for the
-/// tables of docs/records, without the marks of either.
+/// The texts and rows of a section's documentation, shared by the manual page and docs/records,
+/// without the markup of either.
 namespace pallax {
 
 struct ReferenceRow {
@@ -21,7 +21,7 @@ struct ReferenceRow {
 /// The fields of a record, of the entries of a list, or of a subpacket.
 struct ReferenceTable {
     std::string heading;  ///< empty for the record itself
-    std::string sentence; ///< how the entries lie; may be empty
+    std::string sentence; ///< the layout of the entries; may be empty
     std::vector<ReferenceRow> rows;
 };
 
@@ -34,7 +34,7 @@ struct CodeText {
 CodeText textOf(const TechnologyReference& technology, const SectionReference& section,
                 const CodeDescription& code);
 
-/// Of IFX: the keys and what they tell.
+/// For IFX: the keys and their meanings.
 ReferenceTable objectTable(const TechnologyReference& technology, const SectionReference& section);
 
 } // namespace pallax

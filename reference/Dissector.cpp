@@ -102,7 +102,7 @@ private:
         line(4, "},");
     }
 
-    /// What is known to come in an object stream.
+    /// The known keys of an object stream.
     void writeObjectKeys() {
         line(2, "objects = {");
         for (const SectionReference& section : _technology.sections) {
@@ -156,7 +156,7 @@ private:
     std::string _text;
 };
 
-/// The least energy of each band of `lookUpECNO` with its decibels, ascending.
+/// The lowest energy of each band of `lookUpECNO` with its decibels, ascending.
 std::string luaEnergyBands() {
     constexpr std::uint32_t kFullScale = 524288;
     std::string lines("local energy_bands = {\n");

@@ -7,8 +7,8 @@
 
 namespace pallax {
 
-/// The protocol analyser's dissector: the tables of all technologies, and behind them `program`,
-/// which walks them.
+/// The protocol analyser's dissector: the tables of all technologies, followed by `program`, which
+/// interprets them.
 std::string dissector(std::span<const TechnologyReference> technologies,
                       const std::string& program);
 

@@ -19,7 +19,7 @@ std::string luaExtent(const Extent& extent) {
     return table.str();
 }
 
-/// The number's conversion alone, for it may be no number; Lua knows no %u.
+/// Only the number's conversion, because the value may not be a number; Lua has no %u.
 std::string luaConversion(const NumberFormat& format) {
     const std::string whole = printfText(format);
     std::string number = whole.substr(
@@ -35,7 +35,7 @@ std::string unescaped(std::string_view text) {
     for (std::size_t at = 0; at < text.size(); ++at) {
         result.push_back(text[at]);
         if (text[at] == '%') {
-            ++at; // "%%" stands for one per cent sign
+            ++at; // "%%" is one per cent sign
         }
     }
     return result;

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-/// The parts of a description as Lua tables; what has its usual value is left out.
+/// The parts of a description as Lua tables, without default values.
 namespace pallax {
 
 std::string luaPosition(const Position& position);

@@ -6,7 +6,7 @@
 
 namespace pallax {
 
-/// A text as Lua reads it.
+/// A text as a Lua literal.
 std::string luaText(std::string_view text);
 
 /// Builds one Lua table, on one line: { key = value, … }.
@@ -16,7 +16,7 @@ public:
     LuaTable& number(std::string_view key, double value);
     LuaTable& integer(std::string_view key, std::int64_t value);
     LuaTable& truth(std::string_view key, bool value);
-    /// `value` is Lua already.
+    /// `value` must be Lua code.
     LuaTable& raw(std::string_view key, std::string_view value);
     /// An element without a key.
     LuaTable& element(std::string_view value);

@@ -15,10 +15,10 @@ namespace {
 
 constexpr unsigned kByteBits = 8;
 constexpr std::int64_t kLargestByte = 255;
-/// What the constants of the radio access technologies begin with.
+/// The common prefix of the radio access technologies' constants.
 constexpr std::string_view kRadioAccessTechnology = "kHXCellMonitorRadioAccessTechnology";
 
-/// The raw numbers that a field can show, both ends included.
+/// The raw numbers that a field can show, inclusive.
 struct RawRange {
     std::int64_t least;
     std::int64_t most;
@@ -32,7 +32,7 @@ bool isSame(const Position& one, const Position& other) {
            one.isSigned == other.isSigned && one.bigEndian == other.bigEndian;
 }
 
-/// What the width of the position leaves, and a condition on the field's own number.
+/// The range allowed by the position's width and by a condition on the same number.
 RawRange rawRangeOf(const FieldDescription& field) {
     if (!field.position) {
         return {std::numeric_limits<std::int32_t>::min(), std::numeric_limits<std::int32_t>::max()};
@@ -76,7 +76,7 @@ std::string numberOf(const ShownAs& shownAs) {
     return scaled + ", as " + quoted(format);
 }
 
-/// The labels that the raw numbers can reach, and what stands for the others if there are any.
+/// The labels of reachable raw numbers, and the text for the others, if any.
 std::string labelsOf(const ShownAs& shownAs, const RawRange& range) {
     std::string text;
     std::int64_t labelled = 0;
@@ -174,7 +174,7 @@ std::string inWords(const EntryRun& run) {
            (run.layout.stride == 1 ? " byte" : " bytes");
 }
 
-/// The size check of a list that has one: a sentence.
+/// A sentence about the size check of a list, if it has one.
 std::string sizeCheckOf(const ListDescription& list) {
     if (!list.sizeCheck || !list.count) {
         return "";

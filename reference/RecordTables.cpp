@@ -24,7 +24,7 @@ Bytes past the end of a log record read as zero, and a list ends at the first in
 The dissector in `extras/wireshark` shows all of this.
 )";
 
-/// A text inside a table's cell or a sentence.
+/// Escapes a text for a table cell or a sentence.
 std::string escaped(std::string_view text) {
     std::string result;
     for (const char character : text) {

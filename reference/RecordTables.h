@@ -7,7 +7,7 @@
 
 namespace pallax {
 
-/// docs/records/README.md: which technologies there are and how to read the tables.
+/// docs/records/README.md: the technologies and how to read the tables.
 std::string recordTablesIndex(std::span<const TechnologyReference> technologies);
 
 /// docs/records/lte.md and so on: the sections of one technology as tables.

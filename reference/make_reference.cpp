@@ -1,4 +1,5 @@
-// Writes what is made of the records' descriptions into the source tree: make_reference .
+// Writes the files that are generated from the records' descriptions into the source tree:
+// make_reference .
 
 #include "host/DirectoryResources.h"
 #include "reference/ReferenceFiles.h"

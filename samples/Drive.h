@@ -8,14 +8,14 @@
 
 namespace pallax {
 
-/// From `least` up to `largest` and back, once in `period` seconds.
+/// Rises from `least` to `largest` and falls back, once in `period` seconds.
 inline int wave(int second, int period, int least, int largest) {
     const int half = period / 2;
     const int place = std::abs(second % period - half);
     return least + (largest - least) * (half - place) / half;
 }
 
-/// The packets of a drive as they come to mind; sorted by time at the end.
+/// The packets of a drive in any order; sorted by time at the end.
 class Drive {
 public:
     void add(int milliseconds, ByteBuffer data) {

@@ -15,11 +15,11 @@ using doubles::Record;
 constexpr unsigned kMobileCountryCode = 262;
 constexpr unsigned kMobileNetworkCode = 42;
 
-/// A linear energy that stands for that many whole dB below full scale.
+/// A linear energy at this many whole dB below full scale.
 unsigned energyOf(int ecno_db) {
     constexpr double kFullScale = 524288.0;
     constexpr double kOneDecibelDown = 0.7943;
-    // In the middle of the band, so that the last bit of a multiplication cannot matter.
+    // In the middle of the band, so that the last bit of a multiplication does not matter.
     double energy = kFullScale * 0.89;
     for (int step = 1; step < -ecno_db; ++step) {
         energy *= kOneDecibelDown;
@@ -27,7 +27,7 @@ unsigned energyOf(int ecno_db) {
     return static_cast<unsigned>(energy);
 }
 
-/// The receive AGC under which the searcher shows the level of the first cell; 0 without a cell.
+/// The receive AGC with which the searcher shows the level of the first cell; 0 without a cell.
 int agcOf(const std::vector<UmtsCell>& cells) {
     if (cells.empty()) {
         return 0;
@@ -59,8 +59,8 @@ ByteBuffer servingPlmnRecord(unsigned lac, unsigned rac) {
 }
 
 ByteBuffer equivalentPlmnRecord() {
-    // The digits of country and network take turns: 262 and 020. One entry only, for entries stand
-    // 3 bytes apart and are read 6 bytes long, so that a second one shared half of these digits.
+    // The digits of country and network alternate: 262 and 020. Only one entry, because entries are
+    // 3 bytes apart but read 6 bytes long, so a second one would share half of these digits.
     return Record(0x7150).padTo(16).u8(1).append({2, 0, 6, 2, 2, 0}).prefixed();
 }
 
@@ -163,8 +163,8 @@ ByteBuffer gsmMeasurementRecord(const GsmCell& serving, const std::vector<GsmCel
     const auto level = [](const GsmCell& cell) { return static_cast<unsigned>(-cell.rxLevel_dbm); };
     Record record(0x5137);
     record.u8(0).u8(0).u8(level(serving));
-    // C1 and C2. "GSM RR Info" shows the same words as its Rx quality, which therefore goes far
-    // beyond the 0 to 7 of a real one.
+    // C1 and C2. "GSM RR Info" shows the same words as its Rx quality, which therefore exceeds the
+    // 0 to 7 of a real one.
     record.s32(serving.rxLevel_dbm + 105).s32(serving.rxLevel_dbm + 111);
     record.padTo(26).u8(1).u8(0).u8(static_cast<unsigned>(neighbours.size()));
     for (const GsmCell& cell : neighbours) {

@@ -6,8 +6,8 @@
 #include <cstdint>
 #include <vector>
 
-/// The log records of the drive sample, each with the transport prefix, from the values that an
-/// engineer would name. Levels are in dBm, energies in dB.
+/// The log records of the drive sample, each with the transport prefix, from values in engineering
+/// units. Levels are in dBm, energies in dB.
 namespace pallax {
 
 /// A UMTS cell as the searcher sees it.
@@ -25,7 +25,7 @@ struct GsmCell {
     int rxLevel_dbm;
 };
 
-/// A record of up to a few payload bytes, padded to its least length.
+/// A log record of up to a few payload bytes, padded to its minimum length.
 ByteBuffer plainRecord(unsigned logCode, const std::vector<unsigned>& payload, std::size_t length);
 
 /// 0x7135: service, identity and areas of the serving network.
@@ -35,7 +35,7 @@ ByteBuffer equivalentPlmnRecord();
 
 /// 0x417A: the active cell, which is the first, and its neighbours in the monitored set.
 ByteBuffer searcherRecord(const std::vector<UmtsCell>& cells);
-/// 0x4005: the ranking of the UMTS cells, or of the GSM cells where there are no others.
+/// 0x4005: the ranking of the UMTS cells, or of the GSM cells if there are no UMTS cells.
 ByteBuffer rankingRecord(const std::vector<UmtsCell>& umts, const std::vector<GsmCell>& gsm);
 /// 0x4127: identity and frequencies of the serving cell.
 ByteBuffer umtsIdentityRecord(unsigned uarfcn, unsigned cellId, unsigned ura);
@@ -43,7 +43,7 @@ ByteBuffer umtsIdentityRecord(unsigned uarfcn, unsigned cellId, unsigned ura);
 ByteBuffer transmitPowerRecord(int power_dbm);
 /// 0x4116: blocks received and in error on two transport channels.
 ByteBuffer blerRecord(unsigned window, unsigned received, unsigned errors);
-/// 0x4221: two primary HARQ processes, and on two carriers a secondary one.
+/// 0x4221: two primary HARQ processes, and on two carriers also a secondary one.
 enum class Carriers { One, Two };
 ByteBuffer hsdpaRecord(unsigned subFrames, unsigned receivedBits, unsigned errors,
                        Carriers carriers);
@@ -55,7 +55,7 @@ ByteBuffer gsmMeasurementRecord(const GsmCell& serving, const std::vector<GsmCel
 /// 0x51FF: the BSICs of the neighbours.
 ByteBuffer bsicRecord(const std::vector<GsmCell>& neighbours);
 
-/// 0xFF0001, 0xFF0000 and 0xFF0002: a property list behind the header, in one of the two forms.
+/// 0xFF0001, 0xFF0000 and 0xFF0002: a property list after the header, in one of two forms.
 enum class ListForm { Xml, Binary };
 ByteBuffer propertyListRecordOf(unsigned logCode, const PropertyList& object, ListForm form);
 /// The cell monitor's dictionaries.

@@ -7,7 +7,7 @@ namespace pallax {
 
 namespace {
 
-/// One state record: byte 13 the state, 14 the sub-state, 15 the update status.
+/// One state record: byte 13 is the state, 14 the sub-state, 15 the update status.
 struct Event {
     int milliseconds;
     LogCode logCode;
@@ -42,7 +42,7 @@ constexpr auto kEvents = std::to_array<Event>({
     {6020, kGMM, {2, 3, 1}},
     {7140, kGMM, {3, 0, 0}},
     {7180, kRegistration, {1, 0, 0}},
-    // Idle: states are repeated every few seconds; one service request.
+    // Idle: states repeat every few seconds; one service request.
     {9000, kMM, {19, 8, 0}},
     {9010, kGMM, {3, 0, 0}},
     {11400, kGMM, {6, 0, 0}},
@@ -50,7 +50,7 @@ constexpr auto kEvents = std::to_array<Event>({
     {13000, kMM, {19, 8, 0}},
     {13010, kGMM, {3, 0, 0}},
     {15000, kRegistration, {1, 0, 0}},
-    // A new area: this update is rejected, the phone goes back to the old one.
+    // A new area: this update is rejected, and the phone goes back to the old area.
     {16200, kMM, {19, 5, 0}},
     {16260, kRegistration, {2, 0, 0}},
     {16300, kMM, {13, 5, 0}},

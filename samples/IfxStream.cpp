@@ -22,11 +22,11 @@ struct Cell {
     const char* bsic; // NCC and BCC
     const char* cellId;
     const char* lac;
-    int nearest; // the second in which it is the loudest
+    int nearest; // the second at which it is strongest
     int loudest_dBm;
 };
 
-/// The cells around; the first three serve, in this order.
+/// The surrounding cells; the first three serve, in this order.
 constexpr auto kCells = std::to_array<Cell>({
     {"62", "2,3", "20817", "6699", 2, -61},
     {"71", "2,5", "20818", "6699", 15, -64},
@@ -39,7 +39,7 @@ std::size_t servingIndex(int second) {
     return second < kReselection ? 0 : second < kHandover ? 1 : 2;
 }
 
-/// A decibel less for each second of walking, and a little fading.
+/// One decibel less for each second of walking, plus a little fading.
 int levelOf(const Cell& cell, int second) {
     return cell.loudest_dBm - std::abs(second - cell.nearest) - wave(second, 6, 0, 3);
 }
@@ -54,7 +54,7 @@ const char* stateAt(int second) {
                                                      : "Dedicated";
 }
 
-/// The modem wraps what has a unit or a name into a dictionary of its own.
+/// The modem wraps values with a unit or a name in a dictionary of their own.
 PropertyList wrapped(const char* key, std::string value) {
     return Dictionary{{key, std::move(value)}};
 }
@@ -70,8 +70,7 @@ PropertyList servingCell(int second) {
                       {"Area", Dictionary{{"LAC", cell.lac}, {"Cell ID", cell.cellId}}}};
 }
 
-/// A header, then the cells that can be heard; the BSIC of a weak one is not read, and then its
-/// channel stands alone.
+/// A header, then the audible cells; without a BSIC, a weak cell is only its channel.
 PropertyList neighbours(int second) {
     constexpr int kReadable_dBm = -100;
     Array list = {"ARFCN, BSIC, Rx Level"};
@@ -92,7 +91,7 @@ PropertyList neighbours(int second) {
     return list;
 }
 
-/// Nothing while idle.
+/// Empty while idle.
 PropertyList dedicatedChannel(int second) {
     if (second < kCallSetUp || second >= kRelease) {
         return Dictionary{};
@@ -118,11 +117,11 @@ PropertyList pictureAt(int second) {
         {"Serving Cell", servingCell(second)},
         {"Neighbour Cells", neighbours(second)},
         {"Dedicated Channel", dedicatedChannel(second)},
-        {"Barred Cells", Array{"ARFCN"}}, // a header and nothing else
+        {"Barred Cells", Array{"ARFCN"}}, // only a header
     };
 }
 
-/// The forms take turns.
+/// The forms alternate.
 ByteBuffer message(const PropertyList& object, int count) {
     if (count % 3 == 1) {
         return *serializeBinary(object);

@@ -14,14 +14,14 @@ struct SamplePacket {
     ByteBuffer data;
 };
 
-/// A recording that the repository carries; the same on every machine and at every run.
+/// A recording in the repository; the same on every machine and in every run.
 struct Sample {
     std::string_view fileName;   ///< "gsm-attach.pcap"
-    std::string_view technology; ///< as the command line names it
+    std::string_view technology; ///< the name on the command line
     std::vector<SamplePacket> (*packets)();
 };
 
-/// When every sample begins: 2023-11-14 22:13:20 UTC.
+/// The start of every sample: 2023-11-14 22:13:20 UTC.
 inline constexpr Time kSampleStart{std::chrono::seconds{1700000000}};
 
 /// Half a minute of a GSM phone: power-on, search, location update, attach, idle, one rejected
@@ -39,12 +39,12 @@ std::vector<SamplePacket> cdmaDrivePackets();
 /// every technology.
 std::vector<SamplePacket> lteDrivePackets();
 
-/// Two minutes of the simulated UTRAN phone: data sessions, the states that save the battery
-/// between them, cell changes.
+/// Two minutes of the simulated UTRAN phone: data sessions, the battery-saving states between them,
+/// cell changes.
 std::vector<SamplePacket> utranDrivePackets();
 
 /// Half a minute of an IFX phone on foot: a cell change, a call with a handover, neighbours; a
-/// picture every second, as XML, binary and text in turns.
+/// message every second, alternating between XML, binary and text.
 std::vector<SamplePacket> ifxStreamPackets();
 
 } // namespace pallax

@@ -11,7 +11,7 @@ namespace pallax {
 /// Every sample recording of the repository.
 std::span<const Sample> samples();
 
-/// Writes the sample to `path`; the sentence that tells why not, if it could not.
+/// Writes the sample to `path`; returns an error sentence on failure.
 std::optional<std::string> writeSample(const Sample& sample, const std::string& path);
 
 } // namespace pallax

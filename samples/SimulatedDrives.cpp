@@ -4,7 +4,7 @@
 
 #include <chrono>
 
-// Drives of the simulated modem; the seeds are those whose drives show most within their time.
+// Drives of the simulated modem; the seeds were chosen so that the drives show as much as possible.
 
 namespace pallax {
 

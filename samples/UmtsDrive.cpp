@@ -6,7 +6,7 @@ namespace pallax {
 namespace {
 
 constexpr int kSeconds = 120;
-// The phone loses UMTS behind a hill, and finds it again.
+// The phone loses UMTS behind a hill and finds it again.
 constexpr int kToGsm = 56;
 constexpr int kToUmts = 92;
 
@@ -17,13 +17,13 @@ bool onGsm(int second) {
     return second >= kToGsm && second < kToUmts;
 }
 
-/// In a data session (CELL_DCH), which a user has from second 14 to 40 and from 100 to 114.
+/// Whether the user has a data session (CELL_DCH): from second 14 to 40 and from 100 to 114.
 bool inSession(int second) {
     return (second >= 14 && second < 40) || (second >= 100 && second < 114);
 }
 
-/// What the hill takes from every UMTS cell, in dB: ever more before the phone gives up on them,
-/// ever less after it has found them again.
+/// The loss of every UMTS cell behind the hill, in dB: it increases until the phone leaves UMTS,
+/// and decreases after the return.
 int hillLoss_db(int second) {
     constexpr int kSlope_dbPerSecond = 4;
     constexpr int kSlopeSeconds = 5;
@@ -32,12 +32,12 @@ int hillLoss_db(int second) {
     return kSlope_dbPerSecond * std::max(0, second < kToUmts ? before : after);
 }
 
-/// What the searcher shows at least of a level, and of its part of the carrier.
+/// The lowest level, and share of the carrier, that the searcher shows.
 constexpr int kLeastLevelDbm = -118;
 constexpr int kLeastEcnoDb = -20;
 
-/// The UMTS cells around, the strongest first, which serves: it changes whenever the car has come
-/// nearer to the other one. A third cell comes into sight for a while.
+/// The surrounding UMTS cells, strongest first, which serves: it changes when the car is nearer to
+/// the other one. A third cell is visible for a while.
 std::vector<UmtsCell> umtsCells(int second) {
     const int loss_db = hillLoss_db(second);
     const auto level_dbm = [loss_db](int level) {
@@ -50,7 +50,7 @@ std::vector<UmtsCell> umtsCells(int second) {
     }
     std::stable_sort(cells.begin(), cells.end(),
                      [](const UmtsCell& a, const UmtsCell& b) { return a.rscp_dbm > b.rscp_dbm; });
-    // All cells share one carrier: what is weaker than the strongest has that much less of it.
+    // All cells share one carrier: a weaker cell has a correspondingly smaller share of it.
     const int best_db = wave(second, 20, -9, -5) - loss_db / 4;
     for (UmtsCell& cell : cells) {
         cell.ecno_db = std::max(best_db + cell.rscp_dbm - cells.front().rscp_dbm, kLeastEcnoDb);
@@ -58,7 +58,7 @@ std::vector<UmtsCell> umtsCells(int second) {
     return cells;
 }
 
-/// The further away the cell is, the louder the phone: by open-loop power control.
+/// Open-loop power control: the further away the cell, the higher the power.
 int transmitPower_dbm(const UmtsCell& serving) {
     constexpr int kSumOfBoth = -93;
     constexpr int kLargest_dbm = 21;
@@ -115,7 +115,7 @@ void addSimAndContexts(Drive& drive) {
     drive.add(14200, propertyListRecordOf(0xFF0002, Array{internet, messages}, ListForm::Binary));
 }
 
-/// The radio connection of UMTS comes with its ciphering, and goes with it.
+/// The UMTS radio connection and its ciphering begin and end together.
 void addConnection(Drive& drive, int milliseconds, bool connected) {
     drive.add(milliseconds, plainRecord(0x4125, {connected ? 3U : 0U}, 14));
     drive.add(milliseconds + 10, plainRecord(0x4157, {connected ? 1U : 0U}, 19));
@@ -134,7 +134,7 @@ void addPowerOn(Drive& drive) {
     addConnection(drive, 3600, false);
 }
 
-/// A routing-area update at each change of the technology; a few seconds long.
+/// A routing-area update at each change of technology, a few seconds long.
 void addAreaUpdates(Drive& drive) {
     for (const int change : {kToGsm, kToUmts}) {
         const int start = change * 1000;
@@ -162,7 +162,7 @@ void addSessionSecond(Drive& drive, int second) {
     }
 }
 
-/// `servingBefore` is the scrambling code of the second before, 0 for none.
+/// `servingBefore` is the scrambling code one second earlier, 0 for none.
 void addUmtsSecond(Drive& drive, int second, unsigned servingBefore) {
     const int start = second * 1000;
     const std::vector<UmtsCell> cells = umtsCells(second);
@@ -173,7 +173,7 @@ void addUmtsSecond(Drive& drive, int second, unsigned servingBefore) {
         addConnection(drive, start + 30, inSession(second));
     }
     if (second == kToUmts) {
-        drive.add(start + 40, plainRecord(0x512C, {0, 0, 0, 1}, 17)); // GSM rests
+        drive.add(start + 40, plainRecord(0x512C, {0, 0, 0, 1}, 17)); // GSM is inactive
     }
     drive.add(start + 100, searcherRecord(cells));
     drive.add(start + 600, searcherRecord(cells));
@@ -181,7 +181,7 @@ void addUmtsSecond(Drive& drive, int second, unsigned servingBefore) {
         addSessionSecond(drive, second);
     } else if (second % 5 == 4) {
         drive.add(start + 250, rankingRecord({}, gsmNeighbours(second)));
-    } else if (second % 5 != 0) { // in between both sets are left standing
+    } else if (second % 5 != 0) { // in between, both sets keep their entries
         drive.add(start + 250, rankingRecord(cells, {}));
     }
 }
@@ -206,7 +206,7 @@ void addGsmSecond(Drive& drive, int second) {
     const bool dedicated = second >= 68 && second < 84;
     if (second == kToGsm) {
         drive.add(start + 10, plainRecord(0x512C, {14, 0, 0, 1}, 17)); // from UMTS
-        drive.add(start + 20, searcherRecord({}));                     // no cell is left there
+        drive.add(start + 20, searcherRecord({}));                     // no UMTS cell is left
         addGsmBroadcast(drive, start + 500);
     }
     if (second == kToGsm + 2 || second == 84) {
@@ -266,7 +266,7 @@ std::vector<SamplePacket> umtsDrivePackets() {
             serving = umtsCells(second).front().scramblingCode;
         }
         if (second % 5 == 4) {
-            // Behind a GSM ranking, which empties the UMTS set, so that both stand side by side.
+            // After a GSM ranking, which empties the UMTS set, so that both sets have entries.
             addCellMonitor(drive, second);
         }
     }
