@@ -1,5 +1,5 @@
-# How a folder of this project becomes a target. Warnings and language level are
-# set per target, so that no flag leaks into what a target links.
+# Makes a target from a folder. Warnings and language level are set per target, so that no
+# flag affects the libraries that a target links.
 
 add_library(pallax_options INTERFACE)
 target_compile_features(pallax_options INTERFACE cxx_std_20)
@@ -9,13 +9,13 @@ target_compile_options(pallax_options INTERFACE
 # Optimizing, g++ 12 takes `"text" + std::string` for a copy onto itself (its bug 105651).
 target_compile_options(pallax_options INTERFACE $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict>)
 target_include_directories(pallax_options INTERFACE ${PROJECT_SOURCE_DIR})
-# What a user runs reads bytes of strangers: a fault that got through is to end the program.
+# Releases read untrusted bytes: a fault that was missed should end the program.
 target_compile_options(pallax_options INTERFACE
     "$<$<CONFIG:Release>:-fstack-protector-strong;-U_FORTIFY_SOURCE;-D_FORTIFY_SOURCE=2;-fPIE>"
 )
 target_link_options(pallax_options INTERFACE "$<$<CONFIG:Release>:-pie;-Wl,-z,relro,-z,now>")
 if(PALLAX_SANITIZE)
-    # -Wno-maybe-uninitialized: the sanitizers' instrumentation makes g++ 12 see ghosts.
+    # -Wno-maybe-uninitialized: false positives of g++ 12 with the sanitizers' instrumentation.
     target_compile_options(pallax_options INTERFACE
         -fsanitize=${PALLAX_SANITIZE} -fno-sanitize-recover=all -fno-omit-frame-pointer
         $<$<CXX_COMPILER_ID:GNU>:-Wno-maybe-uninitialized>
@@ -25,8 +25,8 @@ endif()
 # An index past the end of a standard container ends a test run, not only under sanitizers.
 target_compile_definitions(pallax_options INTERFACE "$<$<CONFIG:Debug>:_GLIBCXX_ASSERTIONS>")
 if(PALLAX_COVERAGE)
-    # Counters only in what is measured: those of the libraries that tests and templates pull in
-    # would double the build. Every process adds to one of four files for its executable.
+    # Counters only in measured code: those in library templates would double the build time. Every
+    # process adds to one of four files of its executable.
     set(counters -fprofile-instr-generate=${PROJECT_BINARY_DIR}/profile/%4m.profraw)
     target_compile_options(pallax_options INTERFACE
         ${counters} -fcoverage-mapping
@@ -35,7 +35,7 @@ if(PALLAX_COVERAGE)
     target_link_options(pallax_options INTERFACE ${counters})
 endif()
 
-# For what tells the version and its date.
+# For sources that use the version and its date.
 add_library(pallax_version INTERFACE)
 target_compile_definitions(pallax_version INTERFACE
     PALLAX_VERSION="${PROJECT_VERSION}"
@@ -53,7 +53,7 @@ endfunction()
 set(pallax_library_level $<$<CONFIG:Debug>:-O1>)
 
 # Parsing these headers takes most of the time of compiling a source. The preset "core" builds
-# without them: a source of the core that leaves an include out fails there.
+# without them: a source of the core with a missing include fails there.
 if(PALLAX_PRECOMPILE)
     file(WRITE ${PROJECT_BINARY_DIR}/precompiled.cpp "")
     add_library(pallax_precompiled STATIC ${PROJECT_BINARY_DIR}/precompiled.cpp)
@@ -67,7 +67,7 @@ if(PALLAX_PRECOMPILE)
 endif()
 
 # pallax_library(NAME SOURCES file... [LINKS library...])
-# One folder, one static library, linking only what lies below it.
+# One static library for a folder, linking only the folders below it.
 function(pallax_library name)
     cmake_parse_arguments(ARG "" "" "SOURCES;LINKS" ${ARGN})
     add_library(${name} STATIC ${ARG_SOURCES})

@@ -1,6 +1,5 @@
-# Run by cpack on what has been installed, before it becomes a Debian package: what Debian wants of
-# every package and a plain installation need not have. Manual pages are compressed, and there is a
-# changelog in Debian's form, which points to the one that people read.
+# cpack runs this on the installed files before it makes the Debian package, to meet Debian's rules:
+# compresses the manual pages and adds a changelog in Debian's format, which refers to the project's.
 file(GLOB_RECURSE pages "${CPACK_TEMPORARY_DIRECTORY}/usr/share/man/*.[157]")
 if(NOT pages)
     message(FATAL_ERROR "There are no manual pages in ${CPACK_TEMPORARY_DIRECTORY}")
@@ -15,5 +14,5 @@ file(WRITE "${changelog}"
  -- ${CPACK_PACKAGE_CONTACT}  ${CPACK_PALLAX_DATE}
 ")
 
-# Without name and time, so that the same content gives the same bytes.
+# Without name and time, so that equal contents give equal bytes.
 execute_process(COMMAND gzip -9n ${pages} "${changelog}" COMMAND_ERROR_IS_FATAL ANY)
