@@ -1089,10 +1089,10 @@ local energy_bands = {
   { 524288, 0 },
 }
 
--- From here on: how the tables are walked.
+-- From here on: the code that interprets the tables.
 --
--- Every loop ends with the record's bytes, and bytes beyond its end read as zero. What depends on
--- the packets before is worked out when they are first read in order, and remembered by packet.
+-- Every loop ends with the log record's bytes, and bytes past its end read as zero. Values that depend
+-- on earlier packets are computed when the packets are first read in order, and stored by packet.
 
 local HEADER_LENGTH = 13
 local STANDARD_TYPE, EXTENDED_TYPE = 1, 255
@@ -1111,7 +1111,7 @@ local function byte_count(position)
   return math.floor((position.bit + position.width + 7) / 8)
 end
 
--- The number at a position that counts from `start`.
+-- The number at a position relative to `start`.
 local function number_at(record, start, position)
   local count, value = byte_count(position), 0
   for index = 0, count - 1 do
@@ -1129,7 +1129,7 @@ local function whole_bytes(at, count)
   return { byte = at, bit = 0, width = 8 * count }
 end
 
--- The bytes from `at` on, as many of them as there are.
+-- The available bytes from `at` on.
 local function range_of(record, at, length)
   local first = math.min(at, record:len())
   return record:range(first, math.min(length, record:len() - first))
@@ -1139,13 +1139,13 @@ local function toward_zero(value)
   return value >= 0 and math.floor(value) or math.ceil(value)
 end
 
--- As a signed number of that many bits.
+-- Converts to a signed number with this many bits.
 local function signed(value, bits)
   value = value % 2 ^ bits
   return value >= 2 ^ (bits - 1) and value - 2 ^ bits or value
 end
 
--- Rounded to single precision.
+-- Rounds to single precision.
 local function single(value)
   if value == 0 then return 0 end
   local unit = 2 ^ (math.floor(math.log(math.abs(value)) / math.log(2)) - 23)
@@ -1177,7 +1177,7 @@ local function formatted(format, value)
   return (format.before or "") .. number .. (format.behind or "")
 end
 
--- The text of a raw number; of a number also what it is worth.
+-- The text of a raw number and, if it is numeric, its value.
 local function text_of(field, raw)
   if field.except == raw then return field.except_text end
   if field.format then
@@ -1189,7 +1189,7 @@ local function text_of(field, raw)
   return field.beyond_format and formatted(field.beyond_format, raw) or field.beyond
 end
 
--- What packets leave behind
+-- State from earlier packets
 
 local function once(context, name, compute)
   local remembered = context.technology.remembered
@@ -1200,8 +1200,8 @@ local function once(context, name, compute)
   return remembered[key] or nil
 end
 
--- Computed values: each takes the numbers of the bytes that it reads, and gives a number or a text,
--- or nothing where nothing is shown.
+-- Computed values: each function takes the numbers of the bytes that it reads, and returns a number or
+-- a text, or nothing if nothing is shown.
 
 local function digit(half)
   return half <= 9 and tostring(math.floor(half)) or " "
@@ -1310,7 +1310,7 @@ computations["old frame errors"] = function(v, _, context)
   end)
 end
 
--- Where the bytes of an extent are counted from.
+-- The origin of an extent's byte offsets.
 local function origin_of(context, extent)
   if extent.of == "record" then return 0 end
   return extent.of == "companion" and context.companion or context.start
@@ -1330,7 +1330,7 @@ end
 
 -- Items
 
--- An item with its label; under `filter` also with what it can be filtered by, where that is known.
+-- An item with its label and, under `filter`, its filter field if that is known.
 local function add_labelled(context, tree, filter, range, text, value, label)
   local known = filter and context.technology.fields[filter]
   if known and known.is_number and value and value == value then
@@ -1338,7 +1338,7 @@ local function add_labelled(context, tree, filter, range, text, value, label)
   elseif known and not known.is_number then
     tree:add(known.field, range, text, label)
   else
-    tree:add(range, label) -- also a text where others of the key are numbers
+    tree:add(range, label) -- also for a text if other values of the key are numbers
   end
 end
 
@@ -1357,8 +1357,8 @@ local function holds(context, condition)
   return number >= condition.least and number <= condition.most
 end
 
--- The bytes of a field; of a computed one from the first to the last that is read where its first
--- extent lies.
+-- The bytes of a field; for a computed field, from the first to the last byte read in the same place as
+-- its first extent.
 local function range_of_field(context, field)
   if field.position then
     local position = field.position
@@ -1375,7 +1375,7 @@ local function range_of_field(context, field)
   return range_of(context.record, start + first, last - first)
 end
 
--- The text that a field shows, and its number where that is one; nothing where it shows nothing.
+-- The text of a field, and its number if it has one; nothing if it is not shown.
 local function value_of(context, field)
   if field.condition and not holds(context, field.condition) then
     local otherwise = field.condition.otherwise
@@ -1399,7 +1399,7 @@ end
 
 -- Lists
 
-local add_parts -- defined below: an entry may hold lists
+local add_parts -- defined below: an entry may contain lists
 
 local function run_start(context, run)
   local moved = run.move and run.move * number_at(context.record, context.start, run.moved_by) or 0
@@ -1411,7 +1411,7 @@ local function entry_count(context, layout)
   return count + layout.plus
 end
 
--- Whether the list is shown at all of a record of this length.
+-- Whether a log record of this length shows the list at all.
 local function fits(context, layout, count)
   local length = context.record:len()
   local last = run_start(context, layout) + count * layout.stride
@@ -1423,7 +1423,7 @@ local function fits(context, layout, count)
   return count ~= 0 and (count * layout.stride) % 256 <= (length - other) % 256
 end
 
--- Whether all that is shown of an entry lies inside the record.
+-- Whether all displayed parts of an entry are inside the log record.
 local function is_whole(entry, layout, fields)
   local length = entry.record:len()
   if entry.start + layout.bytes_read > length then return false end
@@ -1441,7 +1441,7 @@ local function inside(context, start)
   return setmetatable({ start = start }, { __index = context })
 end
 
--- Calls `see` with each entry that is shown and its index.
+-- Calls `see` with each displayed entry and its index.
 local function each_entry(context, list, count, see)
   local layout, length = list.layout, context.record:len()
   local start = run_start(context, layout)
@@ -1484,7 +1484,7 @@ local function add_entry(context, tree, list, entry, index)
   end
 end
 
--- The pilots of the 1x active set, whose size and scale the subpacket tells.
+-- The pilots of the 1x active set; the subpacket gives their number and scale.
 local function add_varying(context, tree, list)
   local least = 0.00001
   local layout, field = list.layout, list.fields[1]
@@ -1534,13 +1534,13 @@ end
 
 -- Property lists: the bytes of a serialized object as a tree of nodes.
 --
--- A node tells its kind ("string", "integer", "real", "boolean", "data", "date", "array" or
--- "dictionary") and where its bytes lie; a scalar its text, a number also what it is worth. What
--- Pallax takes for no property list is none here either. Beyond that a list may be nested less deep
--- and hold less, and XML that nobody writes is not read.
+-- A node has its kind ("string", "integer", "real", "boolean", "data", "date", "array" or
+-- "dictionary") and its byte range; a scalar has its text, a number also its value. Inputs that Pallax
+-- refuses are refused here too. The limits of depth and size are lower than in Pallax, and unusual XML
+-- is not read.
 
 local DEEPEST_LIST, MOST_VALUES = 64, 20000
-local MOST_EXPANDED = 65536 -- bytes of texts, beyond those of the list
+local MOST_EXPANDED = 65536 -- bytes of texts, in addition to those of the list
 local SECONDS_OF_DAY = 86400
 local REFUSAL = "no property list that can be read"
 
@@ -1553,7 +1553,7 @@ local function count_value(source, depth)
   if source.values > MOST_VALUES or depth > DEEPEST_LIST then refuse() end
 end
 
--- Goes on behind the pattern where it stands next, and gives its captures, or true.
+-- If the pattern comes next, advances past it and returns its captures, or true.
 local function take(source, pattern)
   local first, last, found, other = source.bytes:find("^" .. pattern, source.next)
   if first then source.next = last + 1 end
@@ -1564,7 +1564,7 @@ local function new_dictionary()
   return { kind = "dictionary", entries = {}, places = {} }
 end
 
--- A key that stands twice keeps its first place and takes its last value.
+-- A repeated key keeps its first position and its last value.
 local function set_entry(dictionary, key, value)
   local known = dictionary.places[key]
   if known then
@@ -1576,13 +1576,13 @@ local function set_entry(dictionary, key, value)
   end
 end
 
--- The node under a key; nothing where there is none, or no dictionary.
+-- The node under a key; nothing if it is missing or the parent is not a dictionary.
 local function find(node, key)
   local entry = node.kind == "dictionary" and node.places[key]
   return entry and entry.value or nil
 end
 
--- The number of a node that is a signed one of 32 bits.
+-- The number of a node if it is a signed 32-bit number.
 local function int32_of(node)
   local number = node.number
   local is_whole = number and number == math.floor(number)
@@ -1633,7 +1633,7 @@ end
 
 -- Texts of scalars, as `pallax decode` writes them
 
--- The shortest text that reads back the same, without an exponent where that is no longer.
+-- The shortest text that reads back the same; without an exponent if that is not longer.
 local function real_text(number)
   if number ~= number or math.abs(number) == math.huge then return "null" end
   local text
@@ -1672,7 +1672,7 @@ local function base64_text(bytes)
   return table.concat(letters)
 end
 
--- The same of a base64 text that may hold white space; nothing where it is none.
+-- The same for a base64 text, which may contain white space; nothing if it is invalid.
 local function checked_base64(text)
   text = text:gsub("[ \t\r\n]", "")
   local digits, padding = text:match("^([A-Za-z0-9+/]*)(=?=?)$")
@@ -1686,7 +1686,7 @@ local function is_leap(year)
   return year % 4 == 0 and year % 100 ~= 0 or year % 400 == 0
 end
 
--- "2023-11-14T22:13:20Z" where it is a date, else nothing.
+-- "2023-11-14T22:13:20Z" if it is a date, otherwise nothing.
 local function checked_date(text)
   local year, month, day, hour, minute, second =
     text:match("^(%d%d%d%d)%-(%d%d)%-(%d%d)T(%d%d):(%d%d):(%d%d)Z$")
@@ -1698,8 +1698,8 @@ local function checked_date(text)
     and text or nil
 end
 
--- The same of seconds since 2001; nothing outside the years 0 to 9999. Years begin with March, so
--- that the leap day is the last.
+-- The same for seconds since 2001; nothing outside the years 0 to 9999. Years start in March, so that
+-- the leap day is the last.
 local function date_text(seconds)
   if not (math.abs(seconds) < 1e12) then return nil end
   seconds = math.floor(seconds)
@@ -1721,7 +1721,7 @@ local function date_text(seconds)
 end
 
 -- The binary form: "bplist00", the objects, a table of their offsets, and a trailer. Offsets count
--- from 0; numbers have their high byte first.
+-- from 0; numbers are big-endian.
 
 local HEADER, TRAILER = "bplist00", 32
 local INTEGER, DATA, ASCII, UTF16, UTF8, ARRAY, DICTIONARY = 1, 4, 5, 6, 7, 10, 13
@@ -1776,14 +1776,14 @@ local function marker_at(source, offset)
   return marker
 end
 
--- The content of an object, of so many bytes for each of its units.
+-- The content of an object whose units have `unit` bytes each.
 local function content_of(source, marker, unit)
   marker.past = marker.content + marker.count * unit
   if marker.past > source.objects_end then refuse() end
   return source.bytes:sub(marker.content + 1, marker.past)
 end
 
--- Texts and data may overlap: what they expand to stays in proportion to the bytes.
+-- Texts and data may overlap; their expansion is limited in proportion to the bytes.
 local function spend(source, size)
   source.payload = source.payload - size
   if source.payload < 0 then refuse() end
@@ -1813,8 +1813,8 @@ local function binary_text(source, marker)
   return bytes
 end
 
--- Of 1, 2 or 4 bytes unsigned, of 8 signed; of 16 when 64 bits hold the number, with or without a
--- sign.
+-- 1, 2 or 4 bytes are unsigned, 8 signed; 16 are accepted if the number fits 64 bits, signed or
+-- unsigned.
 local function binary_integer(source, marker)
   if marker.low > 4 then refuse() end
   local at, width, is_unsigned = marker.content, 2 ^ marker.low, false
@@ -1830,7 +1830,7 @@ local function binary_integer(source, marker)
     local number = big_endian(source, at, width, source.objects_end)
     return number, string.format("%.0f", number)
   end
-  -- In halves, and the text in another way: a number of Lua may not hold all of the bits.
+  -- In halves, with the text computed separately: a Lua number may not hold all of the bits.
   local low = big_endian(source, at + 4, 4, source.objects_end)
   local high = big_endian(source, at, 4, source.objects_end)
   local range = source.range:range(at, 8)
@@ -1889,7 +1889,7 @@ local function binary_scalar(source, offset, marker)
   return node
 end
 
--- References in a circle end with the greatest depth.
+-- The maximum depth also ends circular references.
 local function binary_value(source, offset, depth)
   count_value(source, depth)
   local marker = marker_at(source, offset)
@@ -1911,7 +1911,7 @@ local function binary_value(source, offset, depth)
       if key.kind == "string" then
         set_entry(node, key.text, value)
       else
-        node.entries[#node.entries + 1] = { value = value } -- counts, but is never displayed
+        node.entries[#node.entries + 1] = { value = value } -- counted, but never displayed
       end
     else
       node.elements[index + 1] = binary_value(source, reference(index), depth + 1)
@@ -1926,9 +1926,9 @@ local function read_binary(source)
   return binary_value(source, offset_of(source, source.root), 1)
 end
 
--- The XML form as programs write it: a declaration, a document type, comments between elements, and
--- references are read; attributes (but for the list's version), sections and comments inside texts
--- are not.
+-- The XML form as programs write it: reads a declaration, a document type, comments between elements,
+-- and references, but no attributes (except the list's version), CDATA sections or comments inside
+-- texts.
 
 local ENTITIES = { lt = "<", gt = ">", amp = "&", quot = '"', apos = "'" }
 
@@ -1950,7 +1950,7 @@ local function character(digits)
   return is_character and utf8_of(code) or refuse()
 end
 
--- A text without its references.
+-- A text with its references replaced.
 local function plain_text(text)
   text = text:gsub("\r\n?", "\n")
   local rest = text:gsub("&#?%w+;", "")
@@ -1961,7 +1961,7 @@ local function plain_text(text)
   return text
 end
 
--- The text up to the end tag of an element, and where it lies.
+-- The text up to the end tag of an element, and its position.
 local function text_of_element(source, name)
   local at = source.next
   local text = take(source, "([^<]*)")
@@ -1974,7 +1974,7 @@ local function trimmed(text)
   return text:match("^[ \t\r\n]*(.-)[ \t\r\n]*$")
 end
 
--- The number and its text, of digits that may be of any count.
+-- The number and its text, with any number of digits.
 local function integer_of(text)
   local sign, digits = trimmed(text):match("^([+-]?)(%d+)$")
   if not sign then
@@ -1999,7 +1999,7 @@ local function real_of(text)
   else
     local significand = digits:match("^([%d.]+)$") or digits:match("^([%d.]+)[eE][+-]?%d+$")
     local is_real = significand and significand:find("^%d*%.?%d*$") and significand:find("%d")
-    number = (is_real and tonumber(digits) or refuse()) + 0.0 -- a real also where Lua has integers
+    number = (is_real and tonumber(digits) or refuse()) + 0.0 -- a real, even if Lua has integers
     local is_in_range = number > 0 and number < math.huge
     if not is_in_range and significand:find("[1-9]") then refuse() end
   end
@@ -2032,12 +2032,12 @@ local function xml_scalar(source, name, first, is_empty)
     node.text, node.number = read(text)
     if not node.text then refuse() end
   end
-  if at == past then at, past = first, source.next end -- of nothing inside, the element
+  if at == past then at, past = first, source.next end -- if empty, the element itself
   node.at, node.length = at - 1, past - at
   return node
 end
 
-local xml_value -- defined below: a container holds values
+local xml_value -- defined below: containers are recursive
 
 local function fill_container(source, node, depth)
   skip_xml_space(source)
@@ -2068,7 +2068,7 @@ function xml_value(source, depth)
   return node
 end
 
--- What stands before the list.
+-- The part before the list.
 local function take_prolog(source)
   take(source, "\239\187\191")
   local declaration = take(source, "(<%?xml%s[^?<>&]*%?>)")
@@ -2123,7 +2123,7 @@ local function skip_text_space(source)
   until not is_comment
 end
 
--- The code point behind "\U", for which two escapes may stand.
+-- The code point after "\U"; two escapes may form one.
 local function unicode_escape(source)
   local code = tonumber(take(source, "[Uu](%x%x%x%x)") or refuse(), 16)
   if code < 0xD800 or code > 0xDFFF then return utf8_of(code) end
@@ -2160,7 +2160,7 @@ local function data_of(source)
   return base64_text((digits:gsub("%x%x", function(byte) return string.char(tonumber(byte, 16)) end)))
 end
 
-local text_value -- defined below: a container holds values
+local text_value -- defined below: containers are recursive
 
 local function fill_text_container(source, node, depth)
   local is_array = node.kind == "array"
@@ -2212,7 +2212,7 @@ local function read_text(source)
   return node
 end
 
--- What is displayed of property lists.
+-- The displayed parts of property lists.
 
 local RADIO_ACCESS_TECHNOLOGY = "kHXCellMonitorCellRadioAccessTechnology"
 local CELL_TYPE = "kHXCellMonitorCellType"
@@ -2226,7 +2226,7 @@ local function form_of(bytes)
   return bytes:find("^[ \t\r\n]*<[?!p]", start) and "XML" or "text"
 end
 
--- The bytes, their form and the root of what they hold, which is nothing where they cannot be read.
+-- The bytes, their form and the root node, which is nil if they cannot be read.
 local function read_property_list(range)
   local bytes = range:raw()
   local list = { range = range, form = form_of(bytes) }
@@ -2243,18 +2243,18 @@ local function add_list_label(tree, list)
   if not list.root then item:append_text(" (not read)") end
 end
 
--- A text from outside in one line.
+-- An untrusted text in one line.
 local function printable(text)
   return (text:gsub("\194[\128-\159]", "\239\191\189"):gsub("%c", "\239\191\189"))
 end
 
--- Values as they come
+-- Values shown as sent
 
 local function range_of_node(list, node)
   return list.range:range(node.at, node.length)
 end
 
-local add_entries -- defined below: a value may hold others
+local add_entries -- defined below: values may be nested
 
 local function add_elements(context, tree, elements, filters)
   for index, node in ipairs(elements) do
@@ -2267,8 +2267,8 @@ local function add_elements(context, tree, elements, filters)
   end
 end
 
--- A value under a key; `filter` is what the key can be filtered by, where that is known, and
--- `filters` the same for the keys that the value holds.
+-- A value under a key; `filter` is the key's filter field if known, and `filters` the same for the
+-- keys inside the value.
 local function add_value(context, tree, key, node, filter, filters)
   local range = range_of_node(context.list, node)
   if node.text then
@@ -2307,7 +2307,7 @@ local function cells_of(root, wanted)
   return cells
 end
 
--- The last of the cells that has a number for a field stays.
+-- The last cell with a number for a field remains.
 local function add_cell_fields(context, tree, fields, cells)
   for _, field in ipairs(fields) do
     local shown
@@ -2369,7 +2369,7 @@ list_sections["cell entries"] = function(context, root, part)
   end
 end
 
--- The sections of a record whose body is a property list.
+-- The sections of a log record whose body is a property list.
 local function add_list_sections(context, tree, parts)
   local has_body = context.record:len() > HEADER_LENGTH
   context.list = has_body and read_property_list(context.record:range(HEADER_LENGTH))
@@ -2386,10 +2386,10 @@ end
 
 -- Object streams
 
-local folded -- defined below: an object holds others
+local folded -- defined below: objects are nested
 
--- A dictionary of one entry gives way to its value, and the first element of an array is left out.
--- Nothing where a value is of a type that no object holds.
+-- Replaces a dictionary with one entry by its value, and omits the first element of an array. Nothing
+-- if a value has a type that objects cannot contain.
 local function display_form(node)
   if node.kind == "string" then return node end
   local form = { kind = node.kind, at = node.at, length = node.length }
@@ -2446,7 +2446,7 @@ end
 
 -- Records
 
--- Where the subpacket begins; nothing when there is none.
+-- The start of the subpacket; nothing if it is missing.
 local function subpacket_start(record, id)
   local start = FIRST_SUBPACKET
   for _ = 1, byte_at(record, SUBPACKET_COUNT) do
@@ -2485,7 +2485,7 @@ local function add_section(context, root, part)
   end
 end
 
--- The record without its transport prefix; nothing where that leaves nothing.
+-- The log record without its transport prefix; nothing if it is empty.
 local function without_prefix(buffer)
   if buffer:len() == 0 then return nil end
   if byte_at(buffer, 0) ~= PREFIX then return buffer end
@@ -2550,7 +2550,7 @@ local function each_object_key(technology, see)
   end
 end
 
--- A field to filter by for each key: a number where every value of the key is one.
+-- A filter field for each key: a number if every value of the key is one.
 local function make_fields(technology)
   technology.fields = {}
   local names = {}

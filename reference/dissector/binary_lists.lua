@@ -1,5 +1,5 @@
 -- The binary form: "bplist00", the objects, a table of their offsets, and a trailer. Offsets count
--- from 0; numbers have their high byte first.
+-- from 0; numbers are big-endian.
 
 local HEADER, TRAILER = "bplist00", 32
 local INTEGER, DATA, ASCII, UTF16, UTF8, ARRAY, DICTIONARY = 1, 4, 5, 6, 7, 10, 13
@@ -54,14 +54,14 @@ local function marker_at(source, offset)
   return marker
 end
 
--- The content of an object, of so many bytes for each of its units.
+-- The content of an object whose units have `unit` bytes each.
 local function content_of(source, marker, unit)
   marker.past = marker.content + marker.count * unit
   if marker.past > source.objects_end then refuse() end
   return source.bytes:sub(marker.content + 1, marker.past)
 end
 
--- Texts and data may overlap: what they expand to stays in proportion to the bytes.
+-- Texts and data may overlap; their expansion is limited in proportion to the bytes.
 local function spend(source, size)
   source.payload = source.payload - size
   if source.payload < 0 then refuse() end
@@ -91,8 +91,8 @@ local function binary_text(source, marker)
   return bytes
 end
 
--- Of 1, 2 or 4 bytes unsigned, of 8 signed; of 16 when 64 bits hold the number, with or without a
--- sign.
+-- 1, 2 or 4 bytes are unsigned, 8 signed; 16 are accepted if the number fits 64 bits, signed or
+-- unsigned.
 local function binary_integer(source, marker)
   if marker.low > 4 then refuse() end
   local at, width, is_unsigned = marker.content, 2 ^ marker.low, false
@@ -108,7 +108,7 @@ local function binary_integer(source, marker)
     local number = big_endian(source, at, width, source.objects_end)
     return number, string.format("%.0f", number)
   end
-  -- In halves, and the text in another way: a number of Lua may not hold all of the bits.
+  -- In halves, with the text computed separately: a Lua number may not hold all of the bits.
   local low = big_endian(source, at + 4, 4, source.objects_end)
   local high = big_endian(source, at, 4, source.objects_end)
   local range = source.range:range(at, 8)
@@ -167,7 +167,7 @@ local function binary_scalar(source, offset, marker)
   return node
 end
 
--- References in a circle end with the greatest depth.
+-- The maximum depth also ends circular references.
 local function binary_value(source, offset, depth)
   count_value(source, depth)
   local marker = marker_at(source, offset)
@@ -189,7 +189,7 @@ local function binary_value(source, offset, depth)
       if key.kind == "string" then
         set_entry(node, key.text, value)
       else
-        node.entries[#node.entries + 1] = { value = value } -- counts, but is never displayed
+        node.entries[#node.entries + 1] = { value = value } -- counted, but never displayed
       end
     else
       node.elements[index + 1] = binary_value(source, reference(index), depth + 1)

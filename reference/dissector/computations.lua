@@ -1,5 +1,5 @@
--- Computed values: each takes the numbers of the bytes that it reads, and gives a number or a text,
--- or nothing where nothing is shown.
+-- Computed values: each function takes the numbers of the bytes that it reads, and returns a number or
+-- a text, or nothing if nothing is shown.
 
 local function digit(half)
   return half <= 9 and tostring(math.floor(half)) or " "
@@ -108,7 +108,7 @@ computations["old frame errors"] = function(v, _, context)
   end)
 end
 
--- Where the bytes of an extent are counted from.
+-- The origin of an extent's byte offsets.
 local function origin_of(context, extent)
   if extent.of == "record" then return 0 end
   return extent.of == "companion" and context.companion or context.start

@@ -1,6 +1,6 @@
 -- Items
 
--- An item with its label; under `filter` also with what it can be filtered by, where that is known.
+-- An item with its label and, under `filter`, its filter field if that is known.
 local function add_labelled(context, tree, filter, range, text, value, label)
   local known = filter and context.technology.fields[filter]
   if known and known.is_number and value and value == value then
@@ -8,7 +8,7 @@ local function add_labelled(context, tree, filter, range, text, value, label)
   elseif known and not known.is_number then
     tree:add(known.field, range, text, label)
   else
-    tree:add(range, label) -- also a text where others of the key are numbers
+    tree:add(range, label) -- also for a text if other values of the key are numbers
   end
 end
 
@@ -27,8 +27,8 @@ local function holds(context, condition)
   return number >= condition.least and number <= condition.most
 end
 
--- The bytes of a field; of a computed one from the first to the last that is read where its first
--- extent lies.
+-- The bytes of a field; for a computed field, from the first to the last byte read in the same place as
+-- its first extent.
 local function range_of_field(context, field)
   if field.position then
     local position = field.position
@@ -45,7 +45,7 @@ local function range_of_field(context, field)
   return range_of(context.record, start + first, last - first)
 end
 
--- The text that a field shows, and its number where that is one; nothing where it shows nothing.
+-- The text of a field, and its number if it has one; nothing if it is not shown.
 local function value_of(context, field)
   if field.condition and not holds(context, field.condition) then
     local otherwise = field.condition.otherwise
@@ -69,7 +69,7 @@ end
 
 -- Lists
 
-local add_parts -- defined below: an entry may hold lists
+local add_parts -- defined below: an entry may contain lists
 
 local function run_start(context, run)
   local moved = run.move and run.move * number_at(context.record, context.start, run.moved_by) or 0
@@ -81,7 +81,7 @@ local function entry_count(context, layout)
   return count + layout.plus
 end
 
--- Whether the list is shown at all of a record of this length.
+-- Whether a log record of this length shows the list at all.
 local function fits(context, layout, count)
   local length = context.record:len()
   local last = run_start(context, layout) + count * layout.stride
@@ -93,7 +93,7 @@ local function fits(context, layout, count)
   return count ~= 0 and (count * layout.stride) % 256 <= (length - other) % 256
 end
 
--- Whether all that is shown of an entry lies inside the record.
+-- Whether all displayed parts of an entry are inside the log record.
 local function is_whole(entry, layout, fields)
   local length = entry.record:len()
   if entry.start + layout.bytes_read > length then return false end
@@ -111,7 +111,7 @@ local function inside(context, start)
   return setmetatable({ start = start }, { __index = context })
 end
 
--- Calls `see` with each entry that is shown and its index.
+-- Calls `see` with each displayed entry and its index.
 local function each_entry(context, list, count, see)
   local layout, length = list.layout, context.record:len()
   local start = run_start(context, layout)
@@ -154,7 +154,7 @@ local function add_entry(context, tree, list, entry, index)
   end
 end
 
--- The pilots of the 1x active set, whose size and scale the subpacket tells.
+-- The pilots of the 1x active set; the subpacket gives their number and scale.
 local function add_varying(context, tree, list)
   local least = 0.00001
   local layout, field = list.layout, list.fields[1]

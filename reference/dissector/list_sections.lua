@@ -1,4 +1,4 @@
--- What is displayed of property lists.
+-- The displayed parts of property lists.
 
 local RADIO_ACCESS_TECHNOLOGY = "kHXCellMonitorCellRadioAccessTechnology"
 local CELL_TYPE = "kHXCellMonitorCellType"
@@ -12,7 +12,7 @@ local function form_of(bytes)
   return bytes:find("^[ \t\r\n]*<[?!p]", start) and "XML" or "text"
 end
 
--- The bytes, their form and the root of what they hold, which is nothing where they cannot be read.
+-- The bytes, their form and the root node, which is nil if they cannot be read.
 local function read_property_list(range)
   local bytes = range:raw()
   local list = { range = range, form = form_of(bytes) }
@@ -29,18 +29,18 @@ local function add_list_label(tree, list)
   if not list.root then item:append_text(" (not read)") end
 end
 
--- A text from outside in one line.
+-- An untrusted text in one line.
 local function printable(text)
   return (text:gsub("\194[\128-\159]", "\239\191\189"):gsub("%c", "\239\191\189"))
 end
 
--- Values as they come
+-- Values shown as sent
 
 local function range_of_node(list, node)
   return list.range:range(node.at, node.length)
 end
 
-local add_entries -- defined below: a value may hold others
+local add_entries -- defined below: values may be nested
 
 local function add_elements(context, tree, elements, filters)
   for index, node in ipairs(elements) do
@@ -53,8 +53,8 @@ local function add_elements(context, tree, elements, filters)
   end
 end
 
--- A value under a key; `filter` is what the key can be filtered by, where that is known, and
--- `filters` the same for the keys that the value holds.
+-- A value under a key; `filter` is the key's filter field if known, and `filters` the same for the
+-- keys inside the value.
 local function add_value(context, tree, key, node, filter, filters)
   local range = range_of_node(context.list, node)
   if node.text then
@@ -93,7 +93,7 @@ local function cells_of(root, wanted)
   return cells
 end
 
--- The last of the cells that has a number for a field stays.
+-- The last cell with a number for a field remains.
 local function add_cell_fields(context, tree, fields, cells)
   for _, field in ipairs(fields) do
     local shown
@@ -155,7 +155,7 @@ list_sections["cell entries"] = function(context, root, part)
   end
 end
 
--- The sections of a record whose body is a property list.
+-- The sections of a log record whose body is a property list.
 local function add_list_sections(context, tree, parts)
   local has_body = context.record:len() > HEADER_LENGTH
   context.list = has_body and read_property_list(context.record:range(HEADER_LENGTH))
@@ -172,10 +172,10 @@ end
 
 -- Object streams
 
-local folded -- defined below: an object holds others
+local folded -- defined below: objects are nested
 
--- A dictionary of one entry gives way to its value, and the first element of an array is left out.
--- Nothing where a value is of a type that no object holds.
+-- Replaces a dictionary with one entry by its value, and omits the first element of an array. Nothing
+-- if a value has a type that objects cannot contain.
 local function display_form(node)
   if node.kind == "string" then return node end
   local form = { kind = node.kind, at = node.at, length = node.length }

@@ -1,7 +1,7 @@
--- From here on: how the tables are walked.
+-- From here on: the code that interprets the tables.
 --
--- Every loop ends with the record's bytes, and bytes beyond its end read as zero. What depends on
--- the packets before is worked out when they are first read in order, and remembered by packet.
+-- Every loop ends with the log record's bytes, and bytes past its end read as zero. Values that depend
+-- on earlier packets are computed when the packets are first read in order, and stored by packet.
 
 local HEADER_LENGTH = 13
 local STANDARD_TYPE, EXTENDED_TYPE = 1, 255
@@ -20,7 +20,7 @@ local function byte_count(position)
   return math.floor((position.bit + position.width + 7) / 8)
 end
 
--- The number at a position that counts from `start`.
+-- The number at a position relative to `start`.
 local function number_at(record, start, position)
   local count, value = byte_count(position), 0
   for index = 0, count - 1 do
@@ -38,7 +38,7 @@ local function whole_bytes(at, count)
   return { byte = at, bit = 0, width = 8 * count }
 end
 
--- The bytes from `at` on, as many of them as there are.
+-- The available bytes from `at` on.
 local function range_of(record, at, length)
   local first = math.min(at, record:len())
   return record:range(first, math.min(length, record:len() - first))
@@ -48,13 +48,13 @@ local function toward_zero(value)
   return value >= 0 and math.floor(value) or math.ceil(value)
 end
 
--- As a signed number of that many bits.
+-- Converts to a signed number with this many bits.
 local function signed(value, bits)
   value = value % 2 ^ bits
   return value >= 2 ^ (bits - 1) and value - 2 ^ bits or value
 end
 
--- Rounded to single precision.
+-- Rounds to single precision.
 local function single(value)
   if value == 0 then return 0 end
   local unit = 2 ^ (math.floor(math.log(math.abs(value)) / math.log(2)) - 23)
@@ -86,7 +86,7 @@ local function formatted(format, value)
   return (format.before or "") .. number .. (format.behind or "")
 end
 
--- The text of a raw number; of a number also what it is worth.
+-- The text of a raw number and, if it is numeric, its value.
 local function text_of(field, raw)
   if field.except == raw then return field.except_text end
   if field.format then
@@ -98,7 +98,7 @@ local function text_of(field, raw)
   return field.beyond_format and formatted(field.beyond_format, raw) or field.beyond
 end
 
--- What packets leave behind
+-- State from earlier packets
 
 local function once(context, name, compute)
   local remembered = context.technology.remembered

@@ -1,12 +1,12 @@
 -- Property lists: the bytes of a serialized object as a tree of nodes.
 --
--- A node tells its kind ("string", "integer", "real", "boolean", "data", "date", "array" or
--- "dictionary") and where its bytes lie; a scalar its text, a number also what it is worth. What
--- Pallax takes for no property list is none here either. Beyond that a list may be nested less deep
--- and hold less, and XML that nobody writes is not read.
+-- A node has its kind ("string", "integer", "real", "boolean", "data", "date", "array" or
+-- "dictionary") and its byte range; a scalar has its text, a number also its value. Inputs that Pallax
+-- refuses are refused here too. The limits of depth and size are lower than in Pallax, and unusual XML
+-- is not read.
 
 local DEEPEST_LIST, MOST_VALUES = 64, 20000
-local MOST_EXPANDED = 65536 -- bytes of texts, beyond those of the list
+local MOST_EXPANDED = 65536 -- bytes of texts, in addition to those of the list
 local SECONDS_OF_DAY = 86400
 local REFUSAL = "no property list that can be read"
 
@@ -19,7 +19,7 @@ local function count_value(source, depth)
   if source.values > MOST_VALUES or depth > DEEPEST_LIST then refuse() end
 end
 
--- Goes on behind the pattern where it stands next, and gives its captures, or true.
+-- If the pattern comes next, advances past it and returns its captures, or true.
 local function take(source, pattern)
   local first, last, found, other = source.bytes:find("^" .. pattern, source.next)
   if first then source.next = last + 1 end
@@ -30,7 +30,7 @@ local function new_dictionary()
   return { kind = "dictionary", entries = {}, places = {} }
 end
 
--- A key that stands twice keeps its first place and takes its last value.
+-- A repeated key keeps its first position and its last value.
 local function set_entry(dictionary, key, value)
   local known = dictionary.places[key]
   if known then
@@ -42,13 +42,13 @@ local function set_entry(dictionary, key, value)
   end
 end
 
--- The node under a key; nothing where there is none, or no dictionary.
+-- The node under a key; nothing if it is missing or the parent is not a dictionary.
 local function find(node, key)
   local entry = node.kind == "dictionary" and node.places[key]
   return entry and entry.value or nil
 end
 
--- The number of a node that is a signed one of 32 bits.
+-- The number of a node if it is a signed 32-bit number.
 local function int32_of(node)
   local number = node.number
   local is_whole = number and number == math.floor(number)
@@ -99,7 +99,7 @@ end
 
 -- Texts of scalars, as `pallax decode` writes them
 
--- The shortest text that reads back the same, without an exponent where that is no longer.
+-- The shortest text that reads back the same; without an exponent if that is not longer.
 local function real_text(number)
   if number ~= number or math.abs(number) == math.huge then return "null" end
   local text
@@ -138,7 +138,7 @@ local function base64_text(bytes)
   return table.concat(letters)
 end
 
--- The same of a base64 text that may hold white space; nothing where it is none.
+-- The same for a base64 text, which may contain white space; nothing if it is invalid.
 local function checked_base64(text)
   text = text:gsub("[ \t\r\n]", "")
   local digits, padding = text:match("^([A-Za-z0-9+/]*)(=?=?)$")
@@ -152,7 +152,7 @@ local function is_leap(year)
   return year % 4 == 0 and year % 100 ~= 0 or year % 400 == 0
 end
 
--- "2023-11-14T22:13:20Z" where it is a date, else nothing.
+-- "2023-11-14T22:13:20Z" if it is a date, otherwise nothing.
 local function checked_date(text)
   local year, month, day, hour, minute, second =
     text:match("^(%d%d%d%d)%-(%d%d)%-(%d%d)T(%d%d):(%d%d):(%d%d)Z$")
@@ -164,8 +164,8 @@ local function checked_date(text)
     and text or nil
 end
 
--- The same of seconds since 2001; nothing outside the years 0 to 9999. Years begin with March, so
--- that the leap day is the last.
+-- The same for seconds since 2001; nothing outside the years 0 to 9999. Years start in March, so that
+-- the leap day is the last.
 local function date_text(seconds)
   if not (math.abs(seconds) < 1e12) then return nil end
   seconds = math.floor(seconds)

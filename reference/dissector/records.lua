@@ -1,6 +1,6 @@
 -- Records
 
--- Where the subpacket begins; nothing when there is none.
+-- The start of the subpacket; nothing if it is missing.
 local function subpacket_start(record, id)
   local start = FIRST_SUBPACKET
   for _ = 1, byte_at(record, SUBPACKET_COUNT) do
@@ -39,7 +39,7 @@ local function add_section(context, root, part)
   end
 end
 
--- The record without its transport prefix; nothing where that leaves nothing.
+-- The log record without its transport prefix; nothing if it is empty.
 local function without_prefix(buffer)
   if buffer:len() == 0 then return nil end
   if byte_at(buffer, 0) ~= PREFIX then return buffer end
@@ -104,7 +104,7 @@ local function each_object_key(technology, see)
   end
 end
 
--- A field to filter by for each key: a number where every value of the key is one.
+-- A filter field for each key: a number if every value of the key is one.
 local function make_fields(technology)
   technology.fields = {}
   local names = {}

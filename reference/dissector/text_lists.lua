@@ -18,7 +18,7 @@ local function skip_text_space(source)
   until not is_comment
 end
 
--- The code point behind "\U", for which two escapes may stand.
+-- The code point after "\U"; two escapes may form one.
 local function unicode_escape(source)
   local code = tonumber(take(source, "[Uu](%x%x%x%x)") or refuse(), 16)
   if code < 0xD800 or code > 0xDFFF then return utf8_of(code) end
@@ -55,7 +55,7 @@ local function data_of(source)
   return base64_text((digits:gsub("%x%x", function(byte) return string.char(tonumber(byte, 16)) end)))
 end
 
-local text_value -- defined below: a container holds values
+local text_value -- defined below: containers are recursive
 
 local function fill_text_container(source, node, depth)
   local is_array = node.kind == "array"

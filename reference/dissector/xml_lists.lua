@@ -1,6 +1,6 @@
--- The XML form as programs write it: a declaration, a document type, comments between elements, and
--- references are read; attributes (but for the list's version), sections and comments inside texts
--- are not.
+-- The XML form as programs write it: reads a declaration, a document type, comments between elements,
+-- and references, but no attributes (except the list's version), CDATA sections or comments inside
+-- texts.
 
 local ENTITIES = { lt = "<", gt = ">", amp = "&", quot = '"', apos = "'" }
 
@@ -22,7 +22,7 @@ local function character(digits)
   return is_character and utf8_of(code) or refuse()
 end
 
--- A text without its references.
+-- A text with its references replaced.
 local function plain_text(text)
   text = text:gsub("\r\n?", "\n")
   local rest = text:gsub("&#?%w+;", "")
@@ -33,7 +33,7 @@ local function plain_text(text)
   return text
 end
 
--- The text up to the end tag of an element, and where it lies.
+-- The text up to the end tag of an element, and its position.
 local function text_of_element(source, name)
   local at = source.next
   local text = take(source, "([^<]*)")
@@ -46,7 +46,7 @@ local function trimmed(text)
   return text:match("^[ \t\r\n]*(.-)[ \t\r\n]*$")
 end
 
--- The number and its text, of digits that may be of any count.
+-- The number and its text, with any number of digits.
 local function integer_of(text)
   local sign, digits = trimmed(text):match("^([+-]?)(%d+)$")
   if not sign then
@@ -71,7 +71,7 @@ local function real_of(text)
   else
     local significand = digits:match("^([%d.]+)$") or digits:match("^([%d.]+)[eE][+-]?%d+$")
     local is_real = significand and significand:find("^%d*%.?%d*$") and significand:find("%d")
-    number = (is_real and tonumber(digits) or refuse()) + 0.0 -- a real also where Lua has integers
+    number = (is_real and tonumber(digits) or refuse()) + 0.0 -- a real, even if Lua has integers
     local is_in_range = number > 0 and number < math.huge
     if not is_in_range and significand:find("[1-9]") then refuse() end
   end
@@ -104,12 +104,12 @@ local function xml_scalar(source, name, first, is_empty)
     node.text, node.number = read(text)
     if not node.text then refuse() end
   end
-  if at == past then at, past = first, source.next end -- of nothing inside, the element
+  if at == past then at, past = first, source.next end -- if empty, the element itself
   node.at, node.length = at - 1, past - at
   return node
 end
 
-local xml_value -- defined below: a container holds values
+local xml_value -- defined below: containers are recursive
 
 local function fill_container(source, node, depth)
   skip_xml_space(source)
@@ -140,7 +140,7 @@ function xml_value(source, depth)
   return node
 end
 
--- What stands before the list.
+-- The part before the list.
 local function take_prolog(source)
   take(source, "\239\187\191")
   local declaration = take(source, "(<%?xml%s[^?<>&]*%?>)")
