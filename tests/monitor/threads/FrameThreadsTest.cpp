@@ -1,11 +1,12 @@
 #include "LogGenerator/Records/ArrayLock.h"
 #include "LogGenerator/Technologies/Technologies.h"
-#include "samples/Sample.h"
 #include "tests/doubles/ModelFixture.h"
 #include "tests/doubles/TemplateCheck.h"
 
 #include <condition_variable>
+#include <fstream>
 #include <future>
+#include <iterator>
 #include <map>
 #include <mutex>
 #include <set>
@@ -47,6 +48,27 @@ std::string textOf(const Frame& frame) {
         text += path;
     }
     return text;
+}
+
+/// The packets of a sample recording, which is a little-endian pcap file.
+std::vector<ByteBuffer> packetsOf(const std::string& sample) {
+    constexpr std::size_t kFileHeader = 24;
+    constexpr std::size_t kPacketHeader = 16;
+    constexpr std::size_t kLengthAt = 8;
+    std::ifstream file(PALLAX_SOURCE_DIR "/samples/" + sample + ".pcap", std::ios::binary);
+    const ByteBuffer bytes{std::istreambuf_iterator<char>(file), {}};
+    std::vector<ByteBuffer> packets;
+    for (std::size_t at = kFileHeader; at + kPacketHeader <= bytes.size();) {
+        std::size_t length = 0;
+        for (std::size_t byte = 0; byte < 4; ++byte) {
+            length |= std::size_t{bytes[at + kLengthAt + byte]} << 8U * byte;
+        }
+        at += kPacketHeader;
+        const auto begin = bytes.begin() + static_cast<std::ptrdiff_t>(at);
+        packets.emplace_back(begin, begin + static_cast<std::ptrdiff_t>(length));
+        at += length;
+    }
+    return packets;
 }
 
 /// Reads each frame in a thread of its own, when it comes and again in the end.
@@ -123,12 +145,14 @@ protected:
         start();
         (void)log.take();
     }
-    /// The packets, with twenty ticks between them.
-    void play(const std::vector<SamplePacket>& packets) {
+    /// A sample recording, with twenty ticks between its packets.
+    void play(const std::string& sample) {
+        const std::vector<ByteBuffer> packets = packetsOf(sample);
+        ASSERT_GE(packets.size(), 20U) << sample;
         const std::size_t packetsOfATick = packets.size() / 20;
         std::size_t count = 0;
-        for (const SamplePacket& packet : packets) {
-            model->updateWithData(packet.data);
+        for (const ByteBuffer& packet : packets) {
+            model->updateWithData(packet);
             if (++count % packetsOfATick == 0) {
                 clock.advance(PallaxModel::kDisplayInterval);
                 queue.advance(PallaxModel::kDisplayInterval);
@@ -138,16 +162,14 @@ protected:
 };
 
 TEST_F(FrameThreadsTest, AFrameStaysAsItWasWhilePacketsChangeTheDisplay) {
-    const std::pair<const char*, std::vector<SamplePacket>> drives[] = {
-        {"Zorell_GSM", umtsDrivePackets()},
-        {"Zorell_LTE", lteDrivePackets()},
-        {"Zorell_UTRAN2", utranDrivePackets()},
-        {"Zorell_CDMA", cdmaDrivePackets()},
-        {"IFX", ifxStreamPackets()}};
-    for (const auto& [name, packets] : drives) {
+    for (const auto& [name, sample] : {std::pair{"Zorell_GSM", "umts-drive"},
+                                       {"Zorell_LTE", "lte-drive"},
+                                       {"Zorell_UTRAN2", "utran-drive"},
+                                       {"Zorell_CDMA", "cdma-drive"},
+                                       {"IFX", "ifx-stream"}}) {
         const auto reader = std::make_shared<ReadingThread>();
         startWith(name, reader);
-        play(packets);
+        play(sample);
         reader->finish();
         EXPECT_GE(reader->expected.size(), 20U) << name;
         EXPECT_EQ(reader->seen, reader->expected) << name;
@@ -162,7 +184,7 @@ TEST_F(FrameThreadsTest, TheArrayLockCannotStopAThreadThatReadsAFrame) {
     };
     const auto latest = std::make_shared<Latest>();
     startWith("Zorell_LTE", latest);
-    play(lteDrivePackets());
+    play("lte-drive");
     ASSERT_NE(latest->frame, nullptr);
     ArrayLock::lockArray();
     auto text = std::async(std::launch::async, [frame = latest->frame] { return textOf(*frame); });
