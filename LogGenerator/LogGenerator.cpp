@@ -39,7 +39,7 @@ PropertyList LogGenerator::generateLogUsingState(Dictionary& /*state*/) {
 }
 
 PropertyList LogGenerator::display(const Dictionary& state) {
-    catchUp();
+    bringDisplayUpToDate();
     const PropertyList* display = state.find("Display");
     return display != nullptr ? *display : PropertyList();
 }

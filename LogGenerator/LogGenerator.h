@@ -35,7 +35,7 @@ struct Technology {
 /// dictionary and a save record, always working on the state dictionary that the model owns.
 ///
 /// The state's keys: "Template" (the display template as loaded), "Display" (the live display, up
-/// to date after `catchUp`), "ExtraInfo", "DisplayState" (data: what was received since the
+/// to date after `display`), "ExtraInfo", "DisplayState" (data: what was received since the
 /// previous display generation; of an object stream the latest object) and "History" (array of at
 /// most 5 entries, oldest first).
 class LogGenerator {
@@ -63,9 +63,6 @@ public:
     /// When the display's values were last read, for a generator that knows it; else null. Valid as
     /// long as the generator.
     virtual const SectionAges* sectionAges() const { return nullptr; }
-    /// Brings the live display up to the latest packet, for whoever looks at it, or at the history,
-    /// without generating it: a generator may read a packet as late as that.
-    virtual void catchUp() {}
     /// True when this generator cannot update the display that an earlier one left in the state.
     virtual bool keepsDisplay(const Dictionary& state) const;
     /// The property-list dictionary that starts the modem's stream.
@@ -86,6 +83,10 @@ public:
                             const GeneratorEnvironment& environment);
 
 protected:
+    /// Brings the live display in the state up to the latest packet: a generator may read a packet
+    /// as late as that.
+    virtual void bringDisplayUpToDate() {}
+
     /// Marks a generator whose parts are missing: its making is not logged, and what its class
     /// builds up is left out.
     struct WithoutParts {};

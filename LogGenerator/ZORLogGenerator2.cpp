@@ -33,7 +33,6 @@ ZORLogGenerator2::ZORLogGenerator2(const GeneratorEnvironment& environment, Part
 }
 
 ZORLogGenerator2::~ZORLogGenerator2() {
-    ZORLogGenerator2::catchUp(); // the display outlives its generator
     // The text names one technology whatever the actual one is.
     systemLog(LogPriority::Warning, "ZOR_GSMLogGenerator is destructed %p",
               static_cast<const void*>(this));
@@ -70,7 +69,7 @@ void ZORLogGenerator2::updateWithData(Bytes data) {
         return;
     }
     for (Base* subscriber : *subscribers) {
-        subscriber->receive(record, code);
+        subscriber->updateWithData(record, code);
     }
 }
 
@@ -164,16 +163,16 @@ PropertyList ZORLogGenerator2::generateLogUsingState(Dictionary& state) {
     if (cIndex == nullptr) {
         return {};
     }
-    catchUp();
+    bringDisplayUpToDate();
     PropertyList display = getDisplayFromState(state);
     handOverCapture(state);
     updateHistoryInState(state, environment().clock);
     return display;
 }
 
-void ZORLogGenerator2::catchUp() {
+void ZORLogGenerator2::bringDisplayUpToDate() {
     if (cIndex != nullptr) {
-        cIndex->catchUp();
+        cIndex->bringDisplayUpToDate();
     }
 }
 

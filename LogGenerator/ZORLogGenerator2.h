@@ -23,7 +23,6 @@ public:
 
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
-    void catchUp() override;
     void setSampleSink(SampleSink* sink) override;
     PropertyList getStartCommand() const override;
 
@@ -38,6 +37,8 @@ public:
     PropertyList getDisplayFromState(Dictionary& state);
 
 protected:
+    void bringDisplayUpToDate() override;
+
     /// What a technology supplies: the template's resource name and a new class index.
     struct Parts {
         std::string pListName;

@@ -2,7 +2,6 @@
 
 #include "LogGenerator/C2K/C2KLogGenerator.h"
 #include "LogGenerator/LTE/LTEClassIndex.h"
-#include "LogGenerator/Records/LayoutRecord.h"
 #include "LogGenerator/UTRAN/UTRANClassIndex.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
 #include "fields/IfxSections.h"
@@ -34,28 +33,19 @@ DictionaryRef templateNamed(const Resources& resources, std::string_view name) {
     return entries;
 }
 
-std::vector<CodeDescription> describe(const Base& record, const ClassIndex& index) {
-    std::vector<CodeDescription> codes = record.describe();
-    for (const auto& [numbered, firstRow] : index.records()) {
-        if (numbered == &record) {
-            numberRows(codes, firstRow);
-        }
-    }
-    return codes;
-}
-
 /// The sections of the records, in the order of the template, whatever stands around them.
 void appendSections(const Dictionary& entries, const ClassIndex& index, const std::string& around,
                     std::vector<SectionReference>& sections) {
     for (const Dictionary::Entry& entry : entries) {
         const std::string path = around + "/" + entry.key.string();
-        if (const Base* record = index.getClass(entry.key.view())) {
-            sections.push_back({std::string(record->getSectionName()), path,
-                                record->sectionKind() == SectionKind::List,
-                                describe(*record, index)});
-            if (const auto* withLayout = dynamic_cast<const LayoutRecord*>(record)) {
-                sections.back().meaning = withLayout->layout().meaning;
-            }
+        if (const auto* numbered = index.recordOf(entry.key.view())) {
+            const RecordLayout& layout = numbered->record->layout();
+            SectionReference& section = sections.emplace_back();
+            section.name = layout.section;
+            section.path = path;
+            section.isList = layout.kind == SectionKind::List;
+            section.codes = describe(layout, numbered->firstRow);
+            section.meaning = layout.meaning;
         } else if (const DictionaryRef inner = entry.value.dictionary()) {
             appendSections(*inner, index, path, sections);
         }
@@ -145,8 +135,12 @@ void appendPlaces(const Dictionary& entries, const std::string& name, const std:
 
 std::vector<SectionReference> cdmaSections(const Resources& resources) {
     std::vector<SectionReference> sections;
-    std::vector<CodeDescription> codes = C2KLogGenerator::describe();
-    numberRows(codes, 0);
+    std::vector<CodeDescription> codes;
+    FieldId row = 0;
+    for (const CodeLayout* layout : C2KLogGenerator::layouts()) {
+        codes.push_back(describe(*layout, row));
+        row += static_cast<FieldId>(rowCount(*layout));
+    }
     appendPlaces(*templateNamed(resources, "C2KTemplate"), "", "", codes, sections);
     return sections;
 }

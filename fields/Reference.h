@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Description.h"
+#include "fields/Description.h"
 #include "fields/Meanings.h"
 #include "platform/Resources.h"
 

@@ -13,7 +13,9 @@ namespace pallax {
 /// nothing to show.
 class DisplayDriver {
 public:
+    /// What the former generator has received is in the display.
     void setGenerator(std::unique_ptr<LogGenerator> generator) {
+        (void)display();
         _generator = std::move(generator);
     }
     const LogGenerator* generator() const { return _generator.get(); }

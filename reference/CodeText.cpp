@@ -58,7 +58,9 @@ private:
 CodeText textOf(const TechnologyReference& technology, const SectionReference& section,
                 const CodeDescription& code) {
     Tables tables(technology, section);
-    tables.add("", "", code.fields, code.lists);
+    if (!code.showsElements()) {
+        tables.add("", "", code.fields, code.lists);
+    }
     for (const SubpacketDescription& subpacket : code.subpackets) {
         tables.add("Subpacket " + std::to_string(subpacket.id), "", subpacket.fields,
                    subpacket.lists);

@@ -88,7 +88,9 @@ private:
         if (code.listPart) {
             line(5, "list = " + luaListPart(*code.listPart) + ",");
         }
-        writeParts(5, code.fields, code.lists);
+        if (!code.showsElements()) {
+            writeParts(5, code.fields, code.lists);
+        }
         if (!code.subpackets.empty()) {
             line(5, "subpackets = {");
             for (const SubpacketDescription& subpacket : code.subpackets) {

@@ -59,7 +59,7 @@ std::string luaFormat(const NumberFormat& format) {
     return table.str();
 }
 
-std::string luaLabels(const ShownAs& shownAs) {
+std::string luaLabels(const Conversion& shownAs) {
     LuaTable labels;
     for (std::size_t index = 0; index < shownAs.labels.size(); ++index) {
         if (shownAs.labels[index] != shownAs.beyond || shownAs.beyondFormat != nullptr) {
@@ -69,7 +69,7 @@ std::string luaLabels(const ShownAs& shownAs) {
     return labels.str();
 }
 
-void addShownAs(LuaTable& table, const ShownAs& shownAs) {
+void addShownAs(LuaTable& table, const Conversion& shownAs) {
     if (shownAs.format != nullptr) {
         table.raw("format", luaFormat(*shownAs.format));
         if (shownAs.scale() != 1.0) {
@@ -113,17 +113,17 @@ void addRun(LuaTable& table, const EntryRun& run) {
     }
 }
 
-std::string_view nameOf(ListPartDescription::Kind kind) {
+std::string_view nameOf(ListPart::Kind kind) {
     switch (kind) {
-    case ListPartDescription::Kind::Keys:
+    case ListPart::Kind::Keys:
         return "keys";
-    case ListPartDescription::Kind::Elements:
+    case ListPart::Kind::Elements:
         return "elements";
-    case ListPartDescription::Kind::FirstCell:
+    case ListPart::Kind::FirstCell:
         return "first cell";
-    case ListPartDescription::Kind::EachCell:
+    case ListPart::Kind::EachCell:
         return "each cell";
-    case ListPartDescription::Kind::CellEntries:
+    case ListPart::Kind::CellEntries:
         break;
     }
     return "cell entries";
@@ -190,7 +190,7 @@ std::string luaField(const FieldDescription& field, const std::string& filter) {
     return table.str();
 }
 
-std::string luaListPart(const ListPartDescription& part) {
+std::string luaListPart(const ListPart& part) {
     LuaTable table;
     table.text("part", nameOf(part.kind));
     if (!part.technologies.empty()) {

@@ -55,7 +55,7 @@ std::string quoted(std::string_view text) {
 }
 
 /// "raw x 0.25 - 140"
-std::string scaledOf(const ShownAs& shownAs) {
+std::string scaledOf(const Conversion& shownAs) {
     std::string text("raw");
     if (shownAs.scale() != 1.0) {
         text.append(" x ").append(decimal(shownAs.scale()));
@@ -67,7 +67,7 @@ std::string scaledOf(const ShownAs& shownAs) {
     return text;
 }
 
-std::string numberOf(const ShownAs& shownAs) {
+std::string numberOf(const Conversion& shownAs) {
     const std::string scaled = scaledOf(shownAs);
     const std::string format = printfText(*shownAs.format);
     if (scaled == "raw") {
@@ -77,7 +77,7 @@ std::string numberOf(const ShownAs& shownAs) {
 }
 
 /// The labels of reachable raw numbers, and the text for the others, if any.
-std::string labelsOf(const ShownAs& shownAs, const RawRange& range) {
+std::string labelsOf(const Conversion& shownAs, const RawRange& range) {
     std::string text;
     std::int64_t labelled = 0;
     for (std::size_t index = 0; index < shownAs.labels.size(); ++index) {
@@ -115,7 +115,7 @@ std::string inWords(const Condition& condition) {
 }
 
 std::string exceptionOf(const FieldDescription& field) {
-    const ShownAs& shownAs = field.shownAs;
+    const Conversion& shownAs = field.shownAs;
     if (!shownAs.exceptional || !rawRangeOf(field).holds(*shownAs.exceptional)) {
         return "";
     }
@@ -133,7 +133,7 @@ std::string conditionOf(const FieldDescription& field) {
 }
 
 std::string valueOf(const FieldDescription& field) {
-    const ShownAs& shownAs = field.shownAs;
+    const Conversion& shownAs = field.shownAs;
     if (!field.formula.empty()) {
         return std::string(field.formula) +
                (shownAs.format != nullptr ? ", as " + quoted(printfText(*shownAs.format)) : "");
@@ -196,19 +196,18 @@ std::string countOf(const ListDescription& list) {
 }
 
 /// "the first serving cell of GSM or UMTS"
-std::string inWords(const ListPartDescription& part) {
+std::string inWords(const ListPart& part) {
     if (!part.words.empty()) {
         return std::string(part.words);
     }
-    std::string text(part.kind == ListPartDescription::Kind::FirstCell ? "the first " : "each ");
+    std::string text(part.kind == ListPart::Kind::FirstCell ? "the first " : "each ");
     text += part.cellType == kHXCellMonitorCellTypeServing ? "serving cell" : "neighbour";
     std::string_view before = " of ";
     for (const std::string_view technology : part.technologies) {
         text.append(before).append(technology.substr(kRadioAccessTechnology.size()));
         before = " or ";
     }
-    return text +
-           (part.kind == ListPartDescription::Kind::EachCell ? "; the last one remains" : "");
+    return text + (part.kind == ListPart::Kind::EachCell ? "; the last one remains" : "");
 }
 
 } // namespace

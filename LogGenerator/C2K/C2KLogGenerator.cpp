@@ -11,7 +11,6 @@
 #include "LogGenerator/C2K/OneXTrafficErrors.h"
 #include "LogGenerator/C2K/ReverseDataRate.h"
 #include "LogGenerator/LogPacket.h"
-#include "LogGenerator/Records/Description.h"
 #include "platform/Resources.h"
 #include "platform/SystemLog.h"
 
@@ -47,9 +46,7 @@ DictionaryRef dictionaryUnder(std::string_view key, const Dictionary& state) {
 C2KLogGenerator::C2KLogGenerator(const GeneratorEnvironment& environment)
     : ZORLogGenerator(environment), _display(std::make_unique<LookupDisplay>(kCodes)) {}
 
-C2KLogGenerator::~C2KLogGenerator() {
-    C2KLogGenerator::catchUp(); // the display outlives its generator
-}
+C2KLogGenerator::~C2KLogGenerator() = default;
 
 std::unique_ptr<LogGenerator> C2KLogGenerator::generator(const GeneratorEnvironment& environment) {
     return std::make_unique<C2KLogGenerator>(environment);
@@ -136,12 +133,12 @@ void C2KLogGenerator::updateFromLog(Bytes packet, const DictionaryRef& lookup, D
     capture(record.bytes());
 }
 
-void C2KLogGenerator::catchUp() {
+void C2KLogGenerator::bringDisplayUpToDate() {
     _display->bringUpToDate();
 }
 
 PropertyList C2KLogGenerator::generateLogUsingState(Dictionary& state) {
-    catchUp();
+    bringDisplayUpToDate();
     PropertyList display = getDisplayFromState(state);
     handOverCapture(state);
     updateHistoryInState(state, environment().clock);
@@ -152,13 +149,8 @@ bool C2KLogGenerator::keepsDisplay(const Dictionary& state) const {
     return ZORLogGenerator::keepsDisplay(state) && dictionaryUnder("Lookup", state) == nullptr;
 }
 
-std::vector<CodeDescription> C2KLogGenerator::describe() {
-    std::vector<CodeDescription> description;
-    description.reserve(kCodes.size());
-    for (const CodeLayout* code : kCodes) {
-        description.push_back(pallax::describe(*code));
-    }
-    return description;
+std::span<const CodeLayout* const> C2KLogGenerator::layouts() {
+    return kCodes;
 }
 
 } // namespace pallax

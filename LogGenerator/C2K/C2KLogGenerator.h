@@ -3,11 +3,11 @@
 #include "LogGenerator/ZORLogGenerator.h"
 
 #include <memory>
-#include <vector>
+#include <span>
 
 namespace pallax {
 
-struct CodeDescription;
+struct CodeLayout;
 class LookupDisplay;
 
 /// The generator of the CDMA technology, 1x and EV-DO. It has no records with sections of their
@@ -28,7 +28,6 @@ public:
 
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
-    void catchUp() override;
     /// Not where the state also holds the places of its values, which an earlier one has left.
     bool keepsDisplay(const Dictionary& state) const override;
     PropertyList getStartCommand() const override;
@@ -44,8 +43,11 @@ public:
     /// reported, but does not stop the packet.
     void updateFromLog(Bytes packet, const DictionaryRef& lookup, Dictionary& state);
 
-    /// What the layouts tell of the packets (Description.h).
-    static std::vector<CodeDescription> describe();
+    /// The layouts in the order of the start command, in which their rows of fields are numbered.
+    static std::span<const CodeLayout* const> layouts();
+
+protected:
+    void bringDisplayUpToDate() override;
 
 private:
     std::unique_ptr<LookupDisplay> _display;

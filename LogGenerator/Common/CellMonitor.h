@@ -1,6 +1,5 @@
 #pragma once
 
-#include "LogGenerator/Records/Description.h"
 #include "LogGenerator/Records/Layout.h"
 #include "LogGenerator/Records/LogRecord.h"
 #include "plist/PropertyList.h"
@@ -45,37 +44,5 @@ constexpr Field cellLevel(std::string_view key, std::string_view cellKey, std::s
     field.listBits = 16;
     return field;
 }
-
-// For records without a layout.
-
-/// The array's elements; none when the root is no array. Nothing, with "Cell Info Array data could
-/// not be constructed" in the log, when the payload is no property list.
-std::optional<Array> readCellMonitorArray(const LogRecord& record);
-
-/// True for a cell of that radio access technology and cell type; an element that lacks either
-/// key, or is no dictionary, is none.
-bool isCell(const PropertyList& element, std::string_view radioAccessTechnology,
-            std::string_view cellType);
-
-/// The cell's number under `key` as a signed 32-bit integer. Nothing, with `failure` in the log at
-/// error priority, when it is missing or no such number.
-std::optional<std::int32_t> cellNumber(const PropertyList& cell, std::string_view key,
-                                       std::string_view failure);
-
-/// One display key that shows a cell's number as decimal text, and the line that is logged when
-/// the cell has none.
-struct CellNumber {
-    std::string_view key;
-    std::string_view cellKey;
-    std::string_view failure;
-};
-
-/// Sets the key of every number that the cell has, in order; one that is missing stops no other.
-/// Without a target (null) there is nothing but the lines of what is missing.
-void showCellNumbers(const DictionaryRef& target, std::span<const CellNumber> numbers,
-                     const PropertyList& cell);
-
-/// What `showCellNumbers` shows of that part of the array.
-CodeDescription describeCells(ListPartDescription part, std::span<const CellNumber> numbers);
 
 } // namespace pallax

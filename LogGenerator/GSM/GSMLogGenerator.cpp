@@ -81,9 +81,7 @@ std::unique_ptr<LogGenerator> GSMLogGenerator::generator(const GeneratorEnvironm
     return std::make_unique<GSMLogGenerator>(environment);
 }
 
-GSMLogGenerator::~GSMLogGenerator() {
-    GSMLogGenerator::catchUp(); // the display outlives its generator
-}
+GSMLogGenerator::~GSMLogGenerator() = default;
 
 void GSMLogGenerator::updateState(Dictionary& state, Bytes data) {
     const PropertyListResult object = parsePropertyList(data);
@@ -106,7 +104,7 @@ PropertyList GSMLogGenerator::displayToCome(const PropertyList& object) {
     return _display;
 }
 
-void GSMLogGenerator::catchUp() {
+void GSMLogGenerator::bringDisplayUpToDate() {
     if (_unshown != nullptr) {
         *_display = displayForm(*_unshown);
         _unshown = nullptr;
@@ -114,7 +112,7 @@ void GSMLogGenerator::catchUp() {
 }
 
 PropertyList GSMLogGenerator::generateLogUsingState(Dictionary& state) {
-    catchUp();
+    bringDisplayUpToDate();
     updateHistoryInState(state, environment().clock);
     const PropertyList* display = state.find("Display");
     return display != nullptr ? *display : PropertyList();

@@ -43,7 +43,6 @@ public:
     /// included, and for a value of another type than the three anywhere in it.
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
-    void catchUp() override;
     /// Every message is the whole display.
     bool keepsDisplay(const Dictionary& /*state*/) const override { return false; }
     PropertyList getStartCommand() const override;
@@ -58,9 +57,12 @@ public:
     /// The single value of a dictionary that has exactly one entry; null for anything else.
     static PropertyList canCollapse(const PropertyList& object);
 
+protected:
+    void bringDisplayUpToDate() override;
+
 private:
     /// The display of an object whose values are of the three types; that of a dictionary is empty
-    /// until `catchUp`, for mostly the next message comes before anybody looks.
+    /// until `bringDisplayUpToDate`, for mostly the next message comes before anybody looks.
     PropertyList displayToCome(const PropertyList& object);
 
     DictionaryRef _unshown; // the object whose display is still to be made, or null

@@ -2,6 +2,8 @@
 
 #include "platform/SystemLog.h"
 
+#include <algorithm>
+
 namespace pallax {
 
 ClassIndex::~ClassIndex() {
@@ -28,10 +30,19 @@ std::vector<std::string> ClassIndex::getAllLogCodes() const {
 }
 
 void ClassIndex::addRows(LayoutRecord& record) {
+    record.display().setLate(true);
     _records.push_back({&record, _nextRow});
     for (const CodeLayout& code : record.layout().codes) {
         _nextRow += static_cast<FieldId>(rowCount(code));
     }
+}
+
+const ClassIndex::Numbered* ClassIndex::recordOf(std::string_view sectionName) const {
+    const auto found =
+        std::find_if(_records.begin(), _records.end(), [sectionName](const Numbered& each) {
+            return each.record->getSectionName() == sectionName;
+        });
+    return found != _records.end() ? &*found : nullptr;
 }
 
 void ClassIndex::setSink(SampleSink* sink) {
@@ -40,9 +51,9 @@ void ClassIndex::setSink(SampleSink* sink) {
     }
 }
 
-void ClassIndex::catchUp() const {
-    for (const auto& [name, record] : classDict) {
-        record->catchUp();
+void ClassIndex::bringDisplayUpToDate() const {
+    for (const auto& [record, firstRow] : _records) {
+        record->display().bringUpToDate();
     }
 }
 

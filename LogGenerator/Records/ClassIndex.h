@@ -37,11 +37,13 @@ public:
         FieldId firstRow;
     };
     const std::vector<Numbered>& records() const { return _records; }
+    /// The record of that section, or null.
+    const Numbered* recordOf(std::string_view sectionName) const;
     /// Gives the samples of all records to `sink`, too, until it is null. The sink outlives the
     /// index, or is taken away.
     void setSink(SampleSink* sink);
-    /// Brings every section up to the latest record.
-    void catchUp() const;
+    /// Brings every section up to the latest record. The sections of an index may lag behind it.
+    void bringDisplayUpToDate() const;
     /// Logs what the section dictionary is.
     void status() const;
 

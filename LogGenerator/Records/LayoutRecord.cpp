@@ -1,6 +1,5 @@
 #include "LogGenerator/Records/LayoutRecord.h"
 
-#include "LogGenerator/Records/Description.h"
 #include "platform/SystemLog.h"
 
 #include <algorithm>
@@ -82,10 +81,6 @@ void LayoutRecord::updateSectionRef(PropertyList section) {
     _display.setSection(sectionRef());
 }
 
-RecordDescription LayoutRecord::describe() const {
-    return pallax::describe(_layout);
-}
-
 void LayoutRecord::setSink(SampleSink* sink, FieldId first) {
     _sink = sink;
     _firstRow = first;
@@ -101,7 +96,7 @@ const LayoutRecord::Code* LayoutRecord::codeOf(LogCode logCode) const {
     return _layout.readsOtherCodes ? &_codes.front() : nullptr;
 }
 
-void LayoutRecord::receive(const LogRecord& record, LogCode logCode) {
+void LayoutRecord::updateWithData(const LogRecord& record, LogCode logCode) {
     systemLog(_layout.priority, "%s", _layout.logLine);
     const Code* code = codeOf(logCode);
     if (code == nullptr) {

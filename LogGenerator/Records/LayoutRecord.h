@@ -18,18 +18,13 @@ public:
     std::string_view getSectionName() const override { return _layout.section; }
     std::span<const LogCode> getLogCodeArray() const override { return _logCodes; }
     void updateSectionRef(PropertyList section) override;
-    void updateWithData(const LogRecord& record, LogCode logCode) override {
-        receive(record, logCode);
-        catchUp();
-    }
-    /// Logs what the record tells, and gives its samples to the sink at once. The display may read
-    /// it later.
-    void receive(const LogRecord& record, LogCode logCode) override;
-    void catchUp() override { _display.bringUpToDate(); }
-    SectionKind sectionKind() const override { return _layout.kind; }
-    RecordDescription describe() const override;
+    /// Logs what the record tells, and gives its samples to the sink at once; the display may take
+    /// them later.
+    void updateWithData(const LogRecord& record, LogCode logCode) override;
 
-    /// What shows the section; behind the latest record until it is brought up to date.
+    /// What kind of section the template must hold for this record.
+    SectionKind sectionKind() const { return _layout.kind; }
+    /// Shows the section.
     SectionDisplay& display() { return _display; }
 
     /// Gives the samples of later records to `sink`, too; this record's rows are numbered from

@@ -13,6 +13,9 @@ void SectionDisplay::setSection(const PropertyList& section) {
 }
 
 void SectionDisplay::keep(const CodeLayout& code, const LogRecord& record, unsigned shape) {
+    if (!_isLate) {
+        return LayoutReader(*this, _memory, 0).read(code, record);
+    }
     if (_keptCode != &code || _keptShape != shape) {
         bringUpToDate();
     }

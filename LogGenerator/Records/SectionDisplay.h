@@ -24,6 +24,8 @@ public:
 
     void setSection(const PropertyList& section);
 
+    /// Whether records may wait until the display is brought up to date; not, unless it is set.
+    void setLate(bool isLate) { _isLate = isLate; }
     /// Keeps an accepted record that may be read late, in place of the one before. `shape` is its
     /// `shapeOf`, or 0 where the code has no shapes.
     void keep(const CodeLayout& code, const LogRecord& record, unsigned shape);
@@ -57,6 +59,7 @@ private:
     std::vector<Open> _open;
     Array _spares;
 
+    bool _isLate = false;
     const CodeLayout* _keptCode = nullptr;
     unsigned _keptShape = 0;
     ByteBuffer _kept;

@@ -31,6 +31,8 @@ public:
     PropertyList display;       ///< put into the state by the next display; if null, the state
                                 ///< keeps its own
     int displaysMade = 0;
+    void bringDisplayUpToDate() override { ++caughtUp; }
+
     int caughtUp = 0;
 
     void updateState(Dictionary& /*state*/, Bytes data) override {
@@ -47,7 +49,6 @@ public:
         const PropertyList* shown = state.find("Display");
         return shown != nullptr ? *shown : PropertyList();
     }
-    void catchUp() override { ++caughtUp; }
     PropertyList getStartCommand() const override { return Dictionary{{"Start", "Fake"}}; }
     PropertyList getSaveContentsFromState(const Dictionary& state) const override {
         return Array{state};

@@ -9,7 +9,7 @@
 
 namespace pallax::doubles {
 
-void SectionFixture::begin(Base& record) {
+void SectionFixture::begin(LayoutRecord& record) {
     _base = &record;
     record.initWithDict(_classDict, _codeDict);
     if (record.sectionKind() == SectionKind::List) {
@@ -31,7 +31,6 @@ void SectionFixture::feed(const Record& record) {
 
 void SectionFixture::feed(const ByteBuffer& bytes, LogCode logCode) {
     _base->updateWithData(LogRecord(bytes), logCode);
-    _base->catchUp();
     lines = _log.take();
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "LogGenerator/Records/Base.h"
+#include "LogGenerator/Records/LayoutRecord.h"
 #include "tests/doubles/RecordBuilder.h"
 #include "tests/doubles/RecordingLog.h"
 
@@ -39,7 +39,7 @@ public:
 protected:
     SectionFixture() = default;
     /// Gives the record its section; it must live as long as the fixture.
-    void begin(Base& record);
+    void begin(LayoutRecord& record);
 
 private:
     RecordingLog _log;

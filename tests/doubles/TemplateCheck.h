@@ -35,7 +35,9 @@ inline void collectKeys(const PropertyList& object, std::map<std::string, Proper
 inline void expectTemplateMatches(const PropertyList& templateObject, const ClassIndex& index) {
     std::map<std::string, PropertyList> keys;
     collectKeys(templateObject, keys);
-    for (const auto& [name, record] : index.classes()) {
+    EXPECT_EQ(index.records().size(), index.classes().size());
+    for (const auto& [record, firstRow] : index.records()) {
+        const std::string name(record->getSectionName());
         ASSERT_TRUE(keys.contains(name)) << name << " is missing in the template";
         const PropertyList& section = keys.at(name);
         if (record->sectionKind() == SectionKind::List) {

@@ -38,7 +38,7 @@ public:
     /// the framing logs for every such packet.
     void feed(const ByteBuffer& bytes) {
         generator.updateState(state, bytes);
-        generator.catchUp();
+        (void)generator.display(state);
         lines = _log.take();
         std::erase_if(lines, [](const RecordingLog::Line& line) {
             return line.text.starts_with("Log Header ") ||

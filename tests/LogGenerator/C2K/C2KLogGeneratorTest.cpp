@@ -41,10 +41,7 @@ protected:
         _generator.updateState(_state, message);
         _lines = log.take();
     }
-    PropertyList display() {
-        _generator.catchUp();
-        return *_state.find("Display");
-    }
+    PropertyList display() { return _generator.display(_state); }
     /// What has been captured since the previous call.
     ByteBuffer captured() {
         (void)_generator.generateLogUsingState(_state);
@@ -288,8 +285,7 @@ TEST_F(C2KWithoutTemplate, OneThatComesLaterIsUsed) {
     _generator.updateState(_state, statusOn(25).prefixed());
     _fixture.resources.add("C2KTemplate", kTemplate);
     _generator.updateState(_state, statusOn(26).prefixed());
-    _generator.catchUp();
-    EXPECT_EQ(*_state.find("Display"), displayOn("26"));
+    EXPECT_EQ(_generator.display(_state), displayOn("26"));
 }
 
 TEST_F(C2KWithoutTemplate, OneWhoseRootIsNoDictionaryCannotBeLoaded) {
@@ -334,8 +330,7 @@ TEST_F(C2KLogGeneratorTest, OfPacketsThatReplaceEachOtherTheLatestIsShownWhenSom
     EXPECT_EQ(*_state.find("Display"), displayOn(""));
     EXPECT_EQ(_generator.generateLogUsingState(_state), displayOn("26"));
     _generator.updateState(_state, statusOn(27).bytes());
-    _generator.catchUp();
-    EXPECT_EQ(*_state.find("Display"), displayOn("27"));
+    EXPECT_EQ(_generator.display(_state), displayOn("27"));
 }
 
 TEST_F(C2KLogGeneratorTest, ThePacketThatWaitsIsShownBeforeTheGeneratorGoes) {
@@ -348,8 +343,7 @@ TEST_F(C2KLogGeneratorTest, ThePacketThatWaitsIsShownBeforeTheGeneratorGoes) {
 TEST_F(C2KLogGeneratorTest, APacketThatIsRefusedReplacesNothing) {
     _generator.updateState(_state, statusOn(25).bytes());
     _generator.updateState(_state, statusOn(26).padTo(51).bytes());
-    _generator.catchUp();
-    EXPECT_EQ(*_state.find("Display"), displayOn("25"));
+    EXPECT_EQ(_generator.display(_state), displayOn("25"));
 }
 
 } // namespace

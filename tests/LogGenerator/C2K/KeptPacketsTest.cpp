@@ -13,10 +13,7 @@ namespace any = doubles::any;
 struct Twin {
     Twin() { fixture.resources.add("C2KTemplate", doubles::flatTemplate()); }
 
-    std::string shown() {
-        generator.catchUp();
-        return state.find("Display")->description();
-    }
+    std::string shown() { return generator.display(state).description(); }
 
     doubles::GeneratorFixture fixture;
     C2KLogGenerator generator{fixture.environment()};

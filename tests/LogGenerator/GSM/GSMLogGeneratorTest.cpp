@@ -33,7 +33,7 @@ struct Stream {
     }
 
     PropertyList value(std::string_view key) const {
-        generator->catchUp();
+        (void)generator->display(state);
         const PropertyList* found = state.find(key);
         return found != nullptr ? *found : PropertyList();
     }

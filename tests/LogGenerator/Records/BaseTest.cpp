@@ -23,12 +23,7 @@ public:
     std::string_view getSectionName() const override { return "Example Section"; }
     std::span<const LogCode> getLogCodeArray() const override { return kCodes; }
 
-    using Base::clearList;
-    using Base::logUnknown;
-    using Base::removeKey;
-    using Base::replaceList;
     using Base::sectionRef;
-    using Base::show;
 };
 
 TEST(Base, RegistersUnderItsSectionNameAndEachOfItsCodes) {
@@ -53,35 +48,7 @@ TEST(Base, ASectionIsStoredAndItsNameLogged) {
     const PropertyList section = Dictionary();
     record.updateSectionRef(section);
     EXPECT_EQ(log.lines(), (Lines{{4, "Example Section"}}));
-    record.show("Key", "value");
-    EXPECT_EQ(section, PropertyList(Dictionary{{"Key", "value"}}));
-    record.removeKey("Key");
-    EXPECT_TRUE(section.dictionary()->empty());
-}
-
-TEST(Base, ARecordWithoutASectionOfItsKindWritesNothing) {
-    Example record;
-    record.show("Key", "value");
-    record.replaceList({"a"});
-    const PropertyList list = Array{"kept"};
-    record.updateSectionRef(list);
-    record.show("Key", "value");
-    EXPECT_EQ(list, PropertyList(Array{"kept"}));
-    const PropertyList keys = Dictionary{{"Key", "kept"}};
-    record.updateSectionRef(keys);
-    record.clearList();
-    record.replaceList({"a"});
-    EXPECT_EQ(keys, PropertyList(Dictionary{{"Key", "kept"}}));
-}
-
-TEST(Base, ListsAreEmptiedAndRefilledInPlace) {
-    Example record;
-    const PropertyList list = Array{"old", "older"};
-    record.updateSectionRef(list);
-    record.replaceList({"new"});
-    EXPECT_EQ(list, PropertyList(Array{"new"})) << "the display shares the array";
-    record.clearList();
-    EXPECT_EQ(list, PropertyList(Array{}));
+    EXPECT_EQ(record.sectionRef().dictionary(), section.dictionary()) << "shared, not copied";
 }
 
 /// The operation waits for the array lock and changes the list only then.
@@ -96,14 +63,6 @@ void expectToWaitForTheLock(const Operation& operation, const PropertyList& list
     EXPECT_EQ(ArrayLock::depth(), 0) << "the lock is given back";
 }
 
-TEST(Base, ListsAreEmptiedAndRefilledUnderTheArrayLock) {
-    Example record;
-    const PropertyList list = Array{"old", "older"};
-    record.updateSectionRef(list);
-    expectToWaitForTheLock([&record] { record.replaceList({"new"}); }, list, {"new"});
-    expectToWaitForTheLock([&record] { record.clearList(); }, list, {});
-}
-
 TEST(Base, AnArrayIsEmptiedOrReplacedUnderTheArrayLock) {
     const PropertyList list = Array{"old", "older"};
     Array& array = *list.array();
@@ -113,12 +72,6 @@ TEST(Base, AnArrayIsEmptiedOrReplacedUnderTheArrayLock) {
         },
         list, {"new", "newer"});
     expectToWaitForTheLock([&array] { Base::clearElementsInArray(array); }, list, {});
-}
-
-TEST(Base, AnUnknownCodeIsLoggedInDecimal) {
-    RecordingLog log;
-    Example::logUnknown(0x7131);
-    EXPECT_EQ(log.lines(), (Lines{{3, "Received an unknown log message: 28977"}}));
 }
 
 TEST(Base, AbstractOperationsAreUnrecognised) {
@@ -159,109 +112,6 @@ TEST(LookUpECNO, EveryBandBeginsAndEndsAsTabled) {
         EXPECT_EQ(Base::lookUpECNO(row.least), row.decibels) << row.least;
         EXPECT_EQ(Base::lookUpECNO(row.largest), row.decibels) << row.largest;
     }
-}
-
-/// Shows each record that it reads; one whose first payload byte is 0 replaces nothing.
-class KeepingRecord final : public Example {
-public:
-    void updateWithData(const LogRecord& record, LogCode logCode) override {
-        read.push_back(record.u8(LogRecord::kHeaderLength));
-        systemLog(LogPriority::Warning, "Read %d", read.back());
-        show("Code", DisplayNumber(std::int64_t{logCode}, kDecimal));
-        show("Value", DisplayNumber(std::int64_t{read.back()}, kDecimal));
-    }
-    bool replacesShown(const LogRecord& record, LogCode /*logCode*/) const override {
-        return record.u8(LogRecord::kHeaderLength) != 0;
-    }
-    unsigned kindOf(const LogRecord& record) const override {
-        return record.u8(LogRecord::kHeaderLength) / 100;
-    }
-
-    void receiveValue(unsigned value, LogCode logCode = kCodes[0]) {
-        const ByteBuffer bytes = doubles::Record(logCode).u8(value).bytes();
-        receive(LogRecord(bytes), logCode);
-    }
-
-    std::vector<int> read; ///< the values, in the order of reading
-};
-
-using Values = std::vector<int>;
-
-TEST(Base, OfRecordsThatReplaceEachOtherOnlyTheLatestIsRead) {
-    KeepingRecord record;
-    const PropertyList section = Dictionary();
-    record.updateSectionRef(section);
-    record.receiveValue(1);
-    record.receiveValue(2);
-    record.receiveValue(3);
-    EXPECT_EQ(record.read, Values());
-    EXPECT_TRUE(section.dictionary()->empty()) << "nobody has looked yet";
-    record.catchUp();
-    record.catchUp();
-    EXPECT_EQ(record.read, (Values{3}));
-    EXPECT_EQ(section, PropertyList(Dictionary{{"Code", "16662"}, {"Value", "3"}}));
-}
-
-TEST(Base, AnotherCodeHasTheKeptRecordReadBeforeIt) {
-    KeepingRecord record;
-    record.receiveValue(1);
-    record.receiveValue(2, kCodes[1]);
-    EXPECT_EQ(record.read, (Values{1}));
-    record.receiveValue(3, kCodes[1]);
-    record.receiveValue(4);
-    EXPECT_EQ(record.read, (Values{1, 3}));
-    record.catchUp();
-    EXPECT_EQ(record.read, (Values{1, 3, 4}));
-}
-
-TEST(Base, ARecordOfAnotherKindHasTheKeptRecordReadBeforeIt) {
-    KeepingRecord record;
-    record.receiveValue(1);
-    record.receiveValue(101);
-    EXPECT_EQ(record.read, (Values{1}));
-    record.receiveValue(102);
-    EXPECT_EQ(record.read, (Values{1}));
-    record.catchUp();
-    EXPECT_EQ(record.read, (Values{1, 102}));
-}
-
-TEST(Base, ARecordThatReplacesNothingIsReadAtOnceBehindTheKeptOne) {
-    KeepingRecord record;
-    record.receiveValue(1);
-    record.receiveValue(0);
-    EXPECT_EQ(record.read, (Values{1, 0}));
-    record.catchUp();
-    EXPECT_EQ(record.read, (Values{1, 0}));
-}
-
-TEST(Base, ARecordIsReadAtOnceForThoseWhoReadItsLogLines) {
-    KeepingRecord record;
-    {
-        const RecordingLog log(static_cast<int>(LogPriority::Error));
-        record.receiveValue(1);
-        EXPECT_EQ(record.read, Values()) << "its line is no error";
-    }
-    const RecordingLog log(static_cast<int>(LogPriority::Warning));
-    record.receiveValue(2);
-    EXPECT_EQ(record.read, (Values{1, 2}));
-    EXPECT_EQ(log.lines(), (Lines{{4, "Read 1"}, {4, "Read 2"}}));
-}
-
-TEST(Base, ANewSectionGetsNothingOfARecordThatCameBeforeIt) {
-    KeepingRecord record;
-    const PropertyList before = Dictionary();
-    const PropertyList after = Dictionary();
-    record.updateSectionRef(before);
-    record.receiveValue(1);
-    record.updateSectionRef(after);
-    record.catchUp();
-    EXPECT_EQ(before, PropertyList(Dictionary{{"Code", "16662"}, {"Value", "1"}}));
-    EXPECT_TRUE(after.dictionary()->empty());
-}
-
-TEST(Base, ARecordClassKeepsNothingUnlessItSaysSo) {
-    const ByteBuffer bytes = doubles::Record(kCodes[0]).bytes();
-    EXPECT_FALSE(Example().replacesShown(LogRecord(bytes), kCodes[0]));
 }
 
 } // namespace

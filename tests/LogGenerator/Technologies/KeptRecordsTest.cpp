@@ -40,7 +40,7 @@ Outcome outcomeOf(int threshold, const Operation& operation) {
     return outcome;
 }
 
-PropertyList emptySection(const Base& record) {
+PropertyList emptySection(const LayoutRecord& record) {
     return record.sectionKind() == SectionKind::List ? PropertyList(Array())
                                                      : PropertyList(Dictionary());
 }
@@ -52,7 +52,8 @@ LogCode anyCodeAfter(LogCode before, const std::vector<LogCode>& codes) {
 
 /// Two of the same record class get the same log records: one reads each when it arrives, the other
 /// may keep it. Whenever somebody looks, both show the same, and errors come at once from both.
-void checkRecord(Base& prompt, Base& late) {
+void checkRecord(LayoutRecord& prompt, LayoutRecord& late) {
+    prompt.display().setLate(false);
     const PropertyList shown = emptySection(prompt);
     const PropertyList shownLate = emptySection(late);
     prompt.updateSectionRef(shown);
@@ -64,12 +65,10 @@ void checkRecord(Base& prompt, Base& late) {
         code = anyCodeAfter(code, codes);
         const ByteBuffer bytes = doubles::anyCellsRecord(code);
         const LogRecord record(bytes);
-        RC_ASSERT(outcomeOf(SystemLog::kEverything, [&] {
-                      prompt.updateWithData(record, code);
-                      prompt.catchUp();
-                  }) == outcomeOf(kErrors, [&] { late.receive(record, code); }));
+        RC_ASSERT(outcomeOf(SystemLog::kEverything, [&] { prompt.updateWithData(record, code); }) ==
+                  outcomeOf(kErrors, [&] { late.updateWithData(record, code); }));
         if (any::boolean()) {
-            RC_ASSERT(outcomeOf(kErrors, [&late] { late.catchUp(); }) == Outcome());
+            RC_ASSERT(outcomeOf(kErrors, [&late] { late.display().bringUpToDate(); }) == Outcome());
             RC_ASSERT(shownLate.description() == shown.description());
         }
     }
@@ -84,7 +83,7 @@ void checkEveryRecord() {
             doubles::FakeStandardOutput notices;
             const Index prompt(notices);
             const Index late(notices);
-            checkRecord(*prompt.getClass(name), *late.getClass(name));
+            checkRecord(*prompt.recordOf(name)->record, *late.recordOf(name)->record);
         })) << section;
     }
 }

@@ -96,8 +96,7 @@ TEST(UTRANLogGenerator, ATemplateNamedUtran_v2AloneIsUsed) {
     const auto generator = UTRANLogGenerator::generator(fixture.environment());
     Dictionary state;
     generator->updateState(state, Record(0xD0E0).u8(1).u8(3).bytes());
-    generator->catchUp();
-    EXPECT_EQ(*state.find("Display"),
+    EXPECT_EQ(generator->display(state),
               PropertyList(Dictionary{{"RRC Info", Dictionary{{"State", "Cell DCH"}}}}));
 }
 

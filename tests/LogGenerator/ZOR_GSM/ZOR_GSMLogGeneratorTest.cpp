@@ -52,8 +52,7 @@ TEST(ZOR_GSMLogGenerator, UsesTheTemplateZOR_GSM) {
     const auto generator = ZOR_GSMLogGenerator::generator(fixture.environment());
     Dictionary state;
     generator->updateState(state, Record(0x7130).u8(3).u8(0).u8(0).bytes());
-    generator->catchUp();
-    EXPECT_EQ(*state.find("Display"),
+    EXPECT_EQ(generator->display(state),
               PropertyList(Dictionary{
                   {"Process PS", Dictionary{{"MM State", "GMM_REGISTERED"},
                                             {"MM Sub State", "GMM_NORMAL_SERVICE"},

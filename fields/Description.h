@@ -1,10 +1,7 @@
 #pragma once
 
-#include "LogGenerator/Records/EntryList.h"
-#include "LogGenerator/Records/FieldGroup.h"
 #include "LogGenerator/Records/Layout.h"
 #include "LogGenerator/Records/Sample.h"
-#include "LogGenerator/Records/ShownAs.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -14,12 +11,9 @@
 #include <string_view>
 #include <vector>
 
-/// What a record class, or a parser of CDMA, reads of its log records and shows of it, told as
-/// data: the manual page, the tables of docs/records and the dissector are written out of it.
-/// Nothing here takes part in decoding.
-///
-/// Positions count from the first byte of what the field stands in: the record, an entry of a list,
-/// or a subpacket. Texts have static storage duration unless they are std::string.
+/// Layouts in containers that can be changed and sorted: the registry of fields, the manual page,
+/// the tables of docs/records and the dissector are made of them. The members are those of the
+/// layouts.
 namespace pallax {
 
 /// One display key.
@@ -27,7 +21,7 @@ struct FieldDescription {
     std::string key; ///< CDMA: the lookup name. Empty: the entry of a list is the value itself
     /// Of the raw number. Nothing for a value of a property list, and for one that is computed.
     std::optional<Position> position = std::nullopt;
-    ShownAs shownAs = {};
+    Conversion shownAs = {};
     std::string_view listKey = {}; ///< under which the property list holds the value
     /// How many low bits of the property list's number count, as a signed one; 0: all.
     unsigned listBits = 0;
@@ -45,12 +39,7 @@ struct FieldDescription {
 
 /// Repeated entries.
 struct ListDescription {
-    /// Which entries of a record that is too short are shown.
-    enum class Fit {
-        UpToFirstCut,
-        AllOrNothing, ///< none unless all lie inside
-        Exact,        ///< none unless the record ends with the last one
-    };
+    using Fit = ListLayout::Fit;
 
     std::string key = {}; ///< under which the list is shown; empty: the section is the list
     EntryRun entries = {};
@@ -77,20 +66,6 @@ struct ListDescription {
     std::string_view meaning = {}; ///< of a list with a key: a sentence
 };
 
-/// Of which part of a property list the fields of a record are.
-struct ListPartDescription {
-    using Kind = ListPart::Kind;
-
-    Kind kind;
-    // Which cells are looked for: the telephony service's constants.
-    std::vector<std::string_view> technologies = {};
-    std::string_view cellType = {};
-    std::string_view words = {}; ///< what the list is, where it is none of cells
-
-    /// Whether the section is a list, and each such part an entry of it.
-    bool isEntries() const { return kind == Kind::Elements || kind == Kind::CellEntries; }
-};
-
 struct SubpacketDescription {
     std::uint8_t id;
     std::vector<FieldDescription> fields;
@@ -108,30 +83,19 @@ struct CodeDescription {
     std::vector<ListDescription> lists = {};
     std::vector<SubpacketDescription> subpackets = {};
 
-    std::optional<ListPartDescription> listPart =
-        std::nullopt;           ///< of a record that is a property list
+    const ListPart* listPart = nullptr; ///< of a record that is a property list
+    /// Whether what it shows are the elements of a property list, whose keys no layout knows.
+    bool showsElements() const {
+        return listPart != nullptr && listPart->kind == ListPart::Kind::Elements;
+    }
     std::string_view note = {}; ///< what else the record does: whole sentences
     std::string_view name = {}; ///< of the log record; empty where another section names it
 };
 
 using RecordDescription = std::vector<CodeDescription>;
 
-/// What the layout says, code by code.
-CodeDescription describe(const CodeLayout& layout);
-RecordDescription describe(const RecordLayout& layout);
-/// Numbers the rows of codes that follow one another from `first` on; returns the next number.
-FieldId numberRows(std::span<CodeDescription> codes, FieldId first);
-
-FieldDescription describeField(const Field& field);
-std::vector<FieldDescription> describeFields(std::span<const Field> fields);
-/// A value that is computed of `read`, as the formula says, and shown under `format`.
-FieldDescription describeComputed(std::string_view key, const NumberFormat& format,
-                                  std::string_view computation, std::string_view formula,
-                                  std::vector<Extent> read);
-/// What `showGroup` shows.
-RecordDescription describeGroups(std::span<const FieldGroup> groups);
-/// A list whose entries are dictionaries of `fields`; the number of entries stands at `count`.
-ListDescription describeList(std::string_view key, const EntryList::Layout& layout,
-                             const Position& count, std::span<const Field> fields);
+/// The rows are numbered from `firstRow` on.
+CodeDescription describe(const CodeLayout& layout, FieldId firstRow = 0);
+RecordDescription describe(const RecordLayout& layout, FieldId firstRow = 0);
 
 } // namespace pallax

@@ -1,4 +1,4 @@
-#include "LogGenerator/Records/Field.h"
+#include "LogGenerator/Records/Conversion.h"
 
 #include "tests/doubles/RecordFixture.h"
 
@@ -64,16 +64,6 @@ TEST(Conversion, AnExceptionalRawValueShowsItsText) {
     const Conversion power = Conversion::number(kDecimalDbm, 1.0, -30.0).except(64, "Not Present");
     EXPECT_EQ(shown(power, 64), "Not Present");
     EXPECT_EQ(shown(power, 63), "33 dBm");
-}
-
-TEST(Field, KeysAreSetInTheOrderOfTheTable) {
-    constexpr auto kManyFields = std::to_array<Field>({
-        {"B", u8At(1), Conversion::number()},
-        {"A", u8At(0), Conversion::label(kLabels)},
-    });
-    const ByteBuffer bytes = {1, 9};
-    doubles::expectInOrder(entryOf(kManyFields, LogRecord(bytes)),
-                           Dictionary{{"B", "9"}, {"A", "One"}});
 }
 
 } // namespace

@@ -1,9 +1,0 @@
-#pragma once
-
-#include "LogGenerator/Records/Conversion.h"
-
-namespace pallax {
-
-using ShownAs = Conversion;
-
-} // namespace pallax
