@@ -13,6 +13,25 @@ ArrayRef placesOf(std::string_view lookupName, const Dictionary& lookup) {
     return found != nullptr ? found->array() : nullptr;
 }
 
+template <class Visit>
+void forEachPlace(std::string_view lookupName, const Dictionary& lookup, const Visit& visit) {
+    const ArrayRef places = placesOf(lookupName, lookup);
+    if (places == nullptr) {
+        return;
+    }
+    for (const PropertyList& each : *places) {
+        const DictionaryRef place = each.dictionary();
+        const PropertyList* key = place != nullptr ? place->find(kKey) : nullptr;
+        const PropertyList* dict = place != nullptr ? place->find(kDict) : nullptr;
+        const DictionaryRef display = dict != nullptr ? dict->dictionary() : nullptr;
+        const Text* name = key != nullptr ? key->text() : nullptr;
+        if (display == nullptr || name == nullptr) {
+            return;
+        }
+        visit(*name, display);
+    }
+}
+
 } // namespace
 
 void addLookupPlace(const Text& lookupName, const Text& key, const DictionaryRef& display,
@@ -29,30 +48,18 @@ void addLookupPlace(const Text& lookupName, const Text& key, const DictionaryRef
 }
 
 std::vector<LookupPlace> lookupPlaces(std::string_view lookupName, const Dictionary& lookup) {
-    std::vector<LookupPlace> found;
-    const ArrayRef places = placesOf(lookupName, lookup);
-    if (places == nullptr) {
-        return found;
-    }
-    for (const PropertyList& each : *places) {
-        const DictionaryRef place = each.dictionary();
-        const PropertyList* key = place != nullptr ? place->find(kKey) : nullptr;
-        const PropertyList* dict = place != nullptr ? place->find(kDict) : nullptr;
-        const DictionaryRef display = dict != nullptr ? dict->dictionary() : nullptr;
-        const Text* name = key != nullptr ? key->text() : nullptr;
-        if (display == nullptr || name == nullptr) {
-            break;
-        }
-        found.push_back({*name, display});
-    }
-    return found;
+    std::vector<LookupPlace> places;
+    forEachPlace(lookupName, lookup, [&places](const Text& key, const DictionaryRef& display) {
+        places.push_back({key, display});
+    });
+    return places;
 }
 
 void setLookupValue(std::string_view lookupName, const PropertyList& value,
                     const Dictionary& lookup) {
-    for (const LookupPlace& place : lookupPlaces(lookupName, lookup)) {
-        place.display->set(place.key, value);
-    }
+    forEachPlace(lookupName, lookup, [&value](const Text& key, const DictionaryRef& display) {
+        display->set(key, value);
+    });
 }
 
 } // namespace pallax

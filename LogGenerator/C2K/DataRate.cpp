@@ -53,9 +53,16 @@ PropertyList dataRateSince(const DataRateNames& names, std::uint32_t sequence, s
 }
 
 std::int64_t weightedSum(std::span<const Counter> counters, const LogRecord& packet) {
+    constexpr std::size_t kCounterLength = 4;
+    const Bytes bytes = packet.bytes();
     std::int64_t sum = 0;
     for (const Counter& counter : counters) {
-        sum += packet.read(u32At(counter.byte)) * counter.weight;
+        if (packet.has(counter.byte + kCounterLength)) { // whole, so that it is one load
+            const auto* at = bytes.data() + counter.byte;
+            const std::uint32_t count = at[0] | std::uint32_t{at[1]} << 8U |
+                                        std::uint32_t{at[2]} << 16U | std::uint32_t{at[3]} << 24U;
+            sum += std::int64_t{count} * counter.weight;
+        }
     }
     return sum;
 }

@@ -33,7 +33,7 @@ inline constexpr std::string_view kDataRateFormula =
 PropertyList dataRateSince(const DataRateNames& names, std::uint32_t sequence, std::int64_t sent,
                            Dictionary& state);
 
-/// What the counters of a packet add up to, each with its weight.
+/// What the counters add up to that the packet holds whole, each with its weight.
 std::int64_t weightedSum(std::span<const Counter> counters, const LogRecord& packet);
 
 } // namespace pallax

@@ -3,6 +3,8 @@
 #include "LogGenerator/C2K/C2KLookup.h"
 #include "LogGenerator/Records/LayoutReader.h"
 
+#include <array>
+#include <charconv>
 #include <utility>
 
 namespace pallax {
@@ -90,7 +92,12 @@ void LookupDisplay::beginList(const SampleList& list) {
 }
 
 void LookupDisplay::beginEntry(std::size_t index, std::int64_t name) {
-    _pilot = std::to_string(index) + ";" + std::to_string(name);
+    constexpr std::size_t kDigits = 20; // of any number of 64 bits
+    std::array<char, 2 * kDigits + 1> key{};
+    char* end = std::to_chars(key.data(), key.data() + kDigits, index).ptr;
+    *end++ = ';';
+    end = std::to_chars(end, key.data() + key.size(), name).ptr;
+    _pilot.assign(key.data(), end);
 }
 
 void LookupDisplay::endList() {
