@@ -22,15 +22,15 @@ public:
         _packets.push_back(
             {kSampleStart + std::chrono::milliseconds(milliseconds), std::move(data)});
     }
-    std::vector<SamplePacket> inOrder() {
+    std::vector<TimedPacket> inOrder() {
         std::stable_sort(
             _packets.begin(), _packets.end(),
-            [](const SamplePacket& a, const SamplePacket& b) { return a.time < b.time; });
+            [](const TimedPacket& a, const TimedPacket& b) { return a.time < b.time; });
         return std::move(_packets);
     }
 
 private:
-    std::vector<SamplePacket> _packets;
+    std::vector<TimedPacket> _packets;
 };
 
 } // namespace pallax

@@ -81,8 +81,8 @@ constexpr auto kEvents = std::to_array<Event>({
 
 } // namespace
 
-std::vector<SamplePacket> gsmAttachPackets() {
-    std::vector<SamplePacket> packets;
+std::vector<TimedPacket> gsmAttachPackets() {
+    std::vector<TimedPacket> packets;
     packets.reserve(kEvents.size());
     for (const Event& event : kEvents) {
         doubles::Record record(event.logCode);

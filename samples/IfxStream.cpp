@@ -132,7 +132,7 @@ ByteBuffer message(const PropertyList& object, int count) {
 
 } // namespace
 
-std::vector<SamplePacket> ifxStreamPackets() {
+std::vector<TimedPacket> ifxStreamPackets() {
     Drive stream;
     for (int second = 0; second < kSeconds; ++second) {
         constexpr int kAfterTheSecond = 140; // milliseconds

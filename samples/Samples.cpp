@@ -7,8 +7,8 @@
 
 namespace pallax {
 
-std::span<const Sample> samples() {
-    static constexpr auto kSamples = std::to_array<Sample>({
+std::span<const SampleRecording> samples() {
+    static constexpr auto kSamples = std::to_array<SampleRecording>({
         {"gsm-attach.pcap", "gsm", gsmAttachPackets},
         {"umts-drive.pcap", "gsm", umtsDrivePackets},
         {"cdma-drive.pcap", "cdma", cdmaDrivePackets},
@@ -19,14 +19,14 @@ std::span<const Sample> samples() {
     return kSamples;
 }
 
-std::optional<std::string> writeSample(const Sample& sample, const std::string& path) {
+std::optional<std::string> writeSample(const SampleRecording& sample, const std::string& path) {
     const RecordedTechnology* technology = technologyOfCommandName(sample.technology);
     auto created = RecordingWriter::create(path, technology->linkType);
     if (!created) {
         return created.error().sentence;
     }
     const std::unique_ptr<RecordingWriter> writer = std::move(created).value();
-    for (const SamplePacket& packet : sample.packets()) {
+    for (const TimedPacket& packet : sample.packets()) {
         if (const auto error = writer->write(packet.time, packet.data)) {
             return error->sentence;
         }

@@ -9,9 +9,9 @@
 namespace pallax {
 
 /// Every sample recording of the repository.
-std::span<const Sample> samples();
+std::span<const SampleRecording> samples();
 
 /// Writes the sample to `path`; returns an error sentence on failure.
-std::optional<std::string> writeSample(const Sample& sample, const std::string& path);
+std::optional<std::string> writeSample(const SampleRecording& sample, const std::string& path);
 
 } // namespace pallax

@@ -12,15 +12,15 @@ namespace {
 
 using std::chrono::seconds;
 
-std::vector<SamplePacket> drive(std::string_view technology, std::uint64_t seed, seconds duration,
-                                unsigned packetsPerSecond) {
+std::vector<TimedPacket> drive(std::string_view technology, std::uint64_t seed, seconds duration,
+                               unsigned packetsPerSecond) {
     SimulationOptions options;
     options.technology = technologyOfCommandName(technology);
     options.seed = seed;
     options.duration = duration;
     options.packetsPerSecond = packetsPerSecond;
     Simulation simulation(options);
-    std::vector<SamplePacket> packets;
+    std::vector<TimedPacket> packets;
     while (const auto packet = simulation.next()) {
         packets.push_back({packet->time, ByteBuffer(packet->data.begin(), packet->data.end())});
     }
@@ -31,15 +31,15 @@ std::vector<SamplePacket> drive(std::string_view technology, std::uint64_t seed,
 
 static_assert(Simulation::kStart == kSampleStart);
 
-std::vector<SamplePacket> cdmaDrivePackets() {
+std::vector<TimedPacket> cdmaDrivePackets() {
     return drive("cdma", 25, seconds(60), 12);
 }
 
-std::vector<SamplePacket> lteDrivePackets() {
+std::vector<TimedPacket> lteDrivePackets() {
     return drive("lte", 8, seconds(120), 10);
 }
 
-std::vector<SamplePacket> utranDrivePackets() {
+std::vector<TimedPacket> utranDrivePackets() {
     return drive("utran", 13, seconds(120), 6);
 }
 

@@ -251,7 +251,7 @@ void addCellMonitor(Drive& drive, int second) {
 
 } // namespace
 
-std::vector<SamplePacket> umtsDrivePackets() {
+std::vector<TimedPacket> umtsDrivePackets() {
     Drive drive;
     addSimAndContexts(drive);
     addPowerOn(drive);

@@ -10,7 +10,7 @@ int main(int argc, char** argv) {
         (void)std::fprintf(stderr, "usage: %s FOLDER\n", argv[0]);
         return 2;
     }
-    for (const pallax::Sample& sample : pallax::samples()) {
+    for (const pallax::SampleRecording& sample : pallax::samples()) {
         const std::string path = std::string(argv[1]) + "/" + std::string(sample.fileName);
         if (const auto error = pallax::writeSample(sample, path)) {
             (void)std::fprintf(stderr, "%s\n", error->c_str());

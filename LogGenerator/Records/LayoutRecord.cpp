@@ -49,9 +49,11 @@ private:
     bool _isHidden = false;
 };
 
-bool checksSize(const CodeLayout& code) {
-    return std::any_of(code.lists.begin(), code.lists.end(),
-                       [](const ListLayout& list) { return list.sizeCheck.has_value(); });
+bool isPlain(const CodeLayout& code) {
+    return code.accepts == nullptr && code.logs == nullptr && !code.exactLength &&
+           code.condition == nullptr &&
+           std::none_of(code.lists.begin(), code.lists.end(),
+                        [](const ListLayout& list) { return list.sizeCheck.has_value(); });
 }
 
 /// Whether records under the code may have different shapes. Few codes have them, and asking each
@@ -78,7 +80,8 @@ void logUnexpectedSizes(const CodeLayout& code, const LogRecord& record) {
 LayoutRecord::LayoutRecord(const RecordLayout& layout) : _layout(layout), _display(_memory) {
     FieldId row = 0;
     for (const CodeLayout& code : layout.codes) {
-        _codes.push_back({&code, row, pallax::isReadLate(code), checksSize(code), hasShapes(code)});
+        _codes.push_back({code.logCode, &code, row, code.minimumLength, isPlain(code),
+                          pallax::isReadLate(code), hasShapes(code)});
         _logCodes.push_back(code.logCode);
         row += static_cast<FieldId>(rowCount(code));
     }
@@ -97,7 +100,7 @@ void LayoutRecord::setSink(SampleSink* sink, FieldId first) {
 
 const LayoutRecord::Code* LayoutRecord::codeOf(LogCode logCode) const {
     const auto found = std::find_if(_codes.begin(), _codes.end(), [logCode](const Code& each) {
-        return each.layout->logCode == logCode;
+        return each.logCode == logCode;
     });
     if (found != _codes.end()) {
         return &*found;
@@ -115,16 +118,8 @@ void LayoutRecord::updateWithData(const LogRecord& record, LogCode logCode) {
         return;
     }
     const CodeLayout& layout = *code->layout;
-    const bool accepted =
-        layout.accepts != nullptr ? layout.accepts(layout, record) : isAllowed(layout, record);
-    if (!accepted) {
+    if (code->isPlain ? !record.has(code->minimumLength) : !accepts(layout, record)) {
         return;
-    }
-    if (layout.logs != nullptr) {
-        layout.logs(layout, record);
-    }
-    if (code->checksSize) {
-        logUnexpectedSizes(layout, record);
     }
     if (!code->isReadLate) {
         return readNow(*code, record);
@@ -133,6 +128,18 @@ void LayoutRecord::updateWithData(const LogRecord& record, LogCode logCode) {
         LayoutReader(*_sink, _memory, _firstRow + code->firstRow).read(layout, record);
     }
     _display.keep(layout, record, code->hasShapes ? shapeOf(layout, record) : 0);
+}
+
+bool LayoutRecord::accepts(const CodeLayout& layout, const LogRecord& record) {
+    const bool accepted =
+        layout.accepts != nullptr ? layout.accepts(layout, record) : isAllowed(layout, record);
+    if (accepted && layout.logs != nullptr) {
+        layout.logs(layout, record);
+    }
+    if (accepted) {
+        logUnexpectedSizes(layout, record);
+    }
+    return accepted;
 }
 
 void LayoutRecord::readNow(const Code& code, const LogRecord& record) {

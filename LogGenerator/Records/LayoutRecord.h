@@ -32,16 +32,19 @@ public:
     void setSink(SampleSink* sink, FieldId first);
 
 private:
-    /// What is worked out once of a code's layout.
+    /// What is worked out once of a code's layout: most packets need no more.
     struct Code {
+        LogCode logCode;
         const CodeLayout* layout;
         FieldId firstRow; ///< from the record's first
+        std::size_t minimumLength;
+        bool isPlain; ///< a long enough record is accepted, and logs nothing of its own
         bool isReadLate;
-        bool checksSize;
         bool hasShapes;
     };
 
     const Code* codeOf(LogCode logCode) const;
+    static bool accepts(const CodeLayout& layout, const LogRecord& record);
     void readNow(const Code& code, const LogRecord& record);
 
     const RecordLayout& _layout;

@@ -69,7 +69,7 @@ TEST_F(EndToEndRecord, WhatIsRecordedDecodesLikeTheRecordingThatWasPlayed) {
 }
 
 TEST_F(EndToEndRecord, EverySampleIsRecordedSoThatItDecodesTheSame) {
-    for (const Sample& sample : samples()) {
+    for (const SampleRecording& sample : samples()) {
         const std::string played = world.path(std::string(sample.fileName));
         ASSERT_EQ(writeSample(sample, played), std::nullopt);
         PallaxProcess service(world, {"service", "--play", played, "--speed", "max"});

@@ -123,9 +123,9 @@ private:
 /// Over the samples, and over drives of several seeds.
 Keys keysShownBy(const TechnologyReference& technology) {
     DisplayOf display(technology);
-    for (const Sample& sample : samples()) {
+    for (const SampleRecording& sample : samples()) {
         if (sample.technology == technology.technology->commandName) {
-            for (const SamplePacket& packet : sample.packets()) {
+            for (const TimedPacket& packet : sample.packets()) {
                 display.feed(packet.data);
             }
         }

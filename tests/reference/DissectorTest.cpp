@@ -26,9 +26,9 @@ protected:
     }
 
     /// Of each log code of a sample, property lists apart, the first packet.
-    static std::vector<ByteBuffer> oneOfEachCode(const Sample& sample) {
+    static std::vector<ByteBuffer> oneOfEachCode(const SampleRecording& sample) {
         std::map<unsigned, ByteBuffer> packets;
-        for (const SamplePacket& packet : sample.packets()) {
+        for (const TimedPacket& packet : sample.packets()) {
             constexpr std::size_t kPrefix = 2;
             constexpr std::size_t kCode = kPrefix + 3;
             if (packet.data.at(kPrefix) == 1) {
@@ -43,17 +43,18 @@ protected:
         return all;
     }
 
-    std::string recordingOf(const Sample& sample, const std::vector<ByteBuffer>& packets) const {
+    std::string recordingOf(const SampleRecording& sample,
+                            const std::vector<ByteBuffer>& packets) const {
         return doubles::recordingOf(_folder, sample.technology, packets);
     }
 
-    static bool hasLogRecords(const Sample& sample) { return sample.technology != "ifx"; }
+    static bool hasLogRecords(const SampleRecording& sample) { return sample.technology != "ifx"; }
 
     doubles::TemporaryFolder _folder;
 };
 
 TEST_F(Dissector, ShowsTheSamplesAsTheyAreDecoded) {
-    for (const Sample& sample : samples()) {
+    for (const SampleRecording& sample : samples()) {
         if (hasLogRecords(sample)) {
             SCOPED_TRACE(sample.fileName);
             const std::string path = PALLAX_SOURCE_DIR "/samples/" + std::string(sample.fileName);
@@ -63,7 +64,7 @@ TEST_F(Dissector, ShowsTheSamplesAsTheyAreDecoded) {
 }
 
 TEST_F(Dissector, ShowsPacketsThatAreCutAsTheyAreDecoded) {
-    for (const Sample& sample : samples()) {
+    for (const SampleRecording& sample : samples()) {
         if (!hasLogRecords(sample) || sample.fileName == "gsm-attach.pcap") {
             continue;
         }
@@ -81,7 +82,7 @@ TEST_F(Dissector, ShowsPacketsThatAreCutAsTheyAreDecoded) {
 }
 
 TEST_F(Dissector, ShowsPacketsOfAnyBytesAsTheyAreDecoded) {
-    for (const Sample& sample : samples()) {
+    for (const SampleRecording& sample : samples()) {
         if (!hasLogRecords(sample) || sample.fileName == "gsm-attach.pcap") {
             continue;
         }
@@ -106,7 +107,7 @@ TEST_F(Dissector, ShowsPacketsOfAnyBytesAsTheyAreDecoded) {
 }
 
 TEST_F(Dissector, TellsHeaderAndLogCode) {
-    const Sample& sample = samples()[3];
+    const SampleRecording& sample = samples()[3];
     ASSERT_EQ(sample.technology, "lte");
     const ByteBuffer antennas = oneOfEachCode(sample).front();
     ByteBuffer ofUnknownCode = antennas;

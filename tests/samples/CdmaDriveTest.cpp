@@ -27,7 +27,7 @@ protected:
 
     /// Plays the whole drive and notes what each lookup name has shown.
     void play() {
-        for (const SamplePacket& packet : cdmaDrivePackets()) {
+        for (const TimedPacket& packet : cdmaDrivePackets()) {
             _generator->updateState(_state, packet.data);
             (void)_generator->display(_state);
             for (const Dictionary::Entry& name : *_state.find("Lookup")->dictionary()) {

@@ -14,7 +14,7 @@ namespace {
 /// What the generator makes of the stream, message by message.
 class IfxStream : public testing::Test {
 protected:
-    void feed(const SamplePacket& packet) {
+    void feed(const TimedPacket& packet) {
         _generator->updateState(_state, packet.data);
         _display = _generator->display(_state).dictionary();
     }
@@ -27,9 +27,9 @@ protected:
 };
 
 TEST_F(IfxStream, EachOfThirtyPicturesReplacesTheDisplayWhole) {
-    const std::vector<SamplePacket> packets = ifxStreamPackets();
+    const std::vector<TimedPacket> packets = ifxStreamPackets();
     EXPECT_EQ(packets.size(), 30U);
-    for (const SamplePacket& packet : packets) {
+    for (const TimedPacket& packet : packets) {
         feed(packet);
         std::string keys;
         for (const Dictionary::Entry& entry : *_display) {
@@ -42,7 +42,7 @@ TEST_F(IfxStream, EachOfThirtyPicturesReplacesTheDisplayWhole) {
 
 TEST_F(IfxStream, TheThreeFormsTakeTurns) {
     std::map<std::string, int> beginnings;
-    for (const SamplePacket& packet : ifxStreamPackets()) {
+    for (const TimedPacket& packet : ifxStreamPackets()) {
         const std::string text(packet.data.begin(), packet.data.end());
         ++beginnings[text.substr(0, text.starts_with('{') ? 1 : 5)];
     }
@@ -65,7 +65,7 @@ TEST_F(IfxStream, ACallComesAndGoesAndThreeCellsServe) {
     std::set<std::string> states;
     std::set<std::string> cells;
     std::size_t hopping = 0;
-    for (const SamplePacket& packet : ifxStreamPackets()) {
+    for (const TimedPacket& packet : ifxStreamPackets()) {
         feed(packet);
         states.insert(shown("RR").string().value_or("(no text)"));
         cells.insert(shown("Serving Cell").dictionary()->find("ARFCN")->string().value());

@@ -21,7 +21,7 @@ TEST(LteDrive, FillsEverySectionBeforeItEnds) {
     const auto generator = LTELogGenerator::generator(fixture.environment());
     Dictionary state;
     std::set<std::string> technologies;
-    for (const SamplePacket& packet : lteDrivePackets()) {
+    for (const TimedPacket& packet : lteDrivePackets()) {
         generator->updateState(state, packet.data);
         const DictionaryRef display = generator->display(state).dictionary();
         for (const PropertyList& each : *display->find("Reselection Candidates List")->array()) {

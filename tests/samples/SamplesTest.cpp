@@ -12,7 +12,7 @@ namespace {
 using doubles::contentOf;
 
 TEST(Samples, TheProgramWritesTheSameBytesAgain) {
-    for (const Sample& sample : samples()) {
+    for (const SampleRecording& sample : samples()) {
         const std::string path = testing::TempDir() + "/again-" + std::string(sample.fileName);
         ASSERT_EQ(writeSample(sample, path), std::nullopt);
         const auto kept = std::filesystem::path(PALLAX_SOURCE_DIR) / "samples" / sample.fileName;
@@ -23,9 +23,9 @@ TEST(Samples, TheProgramWritesTheSameBytesAgain) {
 }
 
 TEST(Samples, TimesNeverGoBack) {
-    for (const Sample& sample : samples()) {
+    for (const SampleRecording& sample : samples()) {
         Time last = kSampleStart;
-        for (const SamplePacket& packet : sample.packets()) {
+        for (const TimedPacket& packet : sample.packets()) {
             EXPECT_GE(packet.time, last) << sample.fileName;
             last = packet.time;
         }

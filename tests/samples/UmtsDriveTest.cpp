@@ -26,11 +26,11 @@ protected:
         (void)_log.take();
     }
 
-    void feed(const SamplePacket& packet) {
+    void feed(const TimedPacket& packet) {
         _generator->updateState(_state, LogPacketStripPrefix(packet.data));
     }
     void feedAll() {
-        for (const SamplePacket& packet : umtsDrivePackets()) {
+        for (const TimedPacket& packet : umtsDrivePackets()) {
             feed(packet);
         }
     }
@@ -79,7 +79,7 @@ TEST_F(UmtsDrive, TheRankedSetsOfBothTechnologiesShowSideBySideAgainAndAgain) {
     Time nextTick = kSampleStart + kTick;
     int both = 0;
     int noActiveCell = 0;
-    for (const SamplePacket& packet : umtsDrivePackets()) {
+    for (const TimedPacket& packet : umtsDrivePackets()) {
         for (; packet.time >= nextTick; nextTick += kTick) {
             both += isFilled("GSM Set") && isFilled("UMTS Set") ? 1 : 0;
             noActiveCell += isFilled("Active Set") ? 0 : 1;

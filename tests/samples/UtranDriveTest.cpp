@@ -30,7 +30,7 @@ protected:
         const auto generator = UTRANLogGenerator::generator(
             {_fixture.clock, _resources, _fixture.bundle, _fixture.standardOutput});
         Time tick = kSampleStart;
-        for (const SamplePacket& packet : utranDrivePackets()) {
+        for (const TimedPacket& packet : utranDrivePackets()) {
             for (; packet.time >= tick; tick += std::chrono::seconds(2)) {
                 (void)generator->generateLogUsingState(_state);
             }
@@ -78,10 +78,10 @@ TEST_F(UtranDrive, AnEmptyResourceFolderSurvivesTheWholeOfIt) {
 }
 
 TEST_F(UtranDrive, ItBringsTheCellMonitorInBothForms) {
-    const std::vector<SamplePacket> packets = utranDrivePackets();
+    const std::vector<TimedPacket> packets = utranDrivePackets();
     const auto startsWith = [&packets](std::string_view text) {
         constexpr std::size_t kPayload = 15; // behind prefix and header
-        return std::count_if(packets.begin(), packets.end(), [text](const SamplePacket& packet) {
+        return std::count_if(packets.begin(), packets.end(), [text](const TimedPacket& packet) {
             const ByteBuffer& data = packet.data;
             return data.size() > kPayload && data[2] == 0xFF && data[5] == 1 &&
                    std::string(data.begin() + kPayload, data.end()).starts_with(text);
