@@ -136,6 +136,10 @@ TEST_F(FrameTest, RowsOfOneNameAreComparedInTheirOrder) {
     EXPECT_EQ(frame->changed(), Paths{"/New"}) << "both stand a place further down";
     show(Dictionary{{"_sorted", "1"}, {"1;Cell", "a"}}, 6);
     EXPECT_EQ(frame->gone(), (Paths{"/New", "/Cell"}));
+    show(Dictionary{{"_sorted", "1"}, {"1;Cell", "a"}, {"2;New", ""}, {"3;Cell", "c"}}, 8);
+    show(Dictionary{{"_sorted", "1"}, {"1;Cell", "a"}, {"3;Cell", "c"}}, 10);
+    EXPECT_EQ(frame->changed(), Paths{}) << "the second is not compared with the first";
+    EXPECT_EQ(frame->gone(), Paths{"/New"});
 }
 
 TEST_F(FrameTest, ListsAreComparedByPosition) {
