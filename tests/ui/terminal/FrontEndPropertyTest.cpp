@@ -11,6 +11,8 @@
 namespace pallax::terminal {
 namespace {
 
+namespace any = doubles::any;
+
 /// Bytes of a script: mostly what does something.
 int anyCode() {
     const int kind = any::between(0, 12);

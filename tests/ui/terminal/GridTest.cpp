@@ -5,12 +5,15 @@
 
 #include <gtest/gtest.h>
 
+#include <array>
 #include <string>
 #include <utility>
 #include <vector>
 
 namespace pallax::terminal {
 namespace {
+
+namespace any = doubles::any;
 
 TEST(GridTest, IsBlankAtFirst) {
     const Grid grid(3, 2);
@@ -170,7 +173,7 @@ std::string anyText() {
         std::to_array<const char*>({"a", " ", "漢", "語", "😀", "한", "\u1161", "\u0301", "\u200d",
                                     "\x1b", "\xff", "\xe6\xbc", "\u0085"});
     std::string text;
-    for (const int piece : any::integers(0, kPieces.size())) {
+    for (const int piece : any::integers(0, static_cast<int>(kPieces.size()))) {
         text += kPieces.at(static_cast<std::size_t>(piece));
     }
     return text;

@@ -7,12 +7,15 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <array>
 #include <string>
 #include <utility>
 #include <vector>
 
 namespace pallax::terminal {
 namespace {
+
+namespace any = doubles::any;
 
 class LineEditorTest : public testing::Test {
 protected:

@@ -7,12 +7,15 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <array>
 #include <initializer_list>
 #include <string>
 #include <vector>
 
 namespace pallax::terminal {
 namespace {
+
+namespace any = doubles::any;
 
 class TerminalTableTest : public testing::Test {
 protected:
@@ -255,11 +258,19 @@ TEST_F(TerminalTableTest, WhateverHappensTheCursorIsOnARowInTheWindow) {
         const int steps = any::between(1, 30);
         for (int step = 0; step < steps; ++step) {
             switch (any::between(0, 6)) {
+<<<<<<< ours
             case 0: {
                 std::vector<NodeRef> rows;
                 for (const int name : any::integers(0, kNames.size())) {
                     rows.push_back(doubles::leafNode(kNames.at(static_cast<std::size_t>(name)),
                                                      std::string(40, 'v')));
+=======
+            case 0:
+                source.rows.clear();
+                for (const int name : any::integers(0, static_cast<int>(kNames.size()))) {
+                    source.rows.push_back(
+                        leafRow(kNames.at(static_cast<std::size_t>(name)), std::string(40, 'v')));
+>>>>>>> theirs
                 }
                 source.show(std::move(rows));
                 table.reloadData();
