@@ -258,19 +258,11 @@ TEST_F(TerminalTableTest, WhateverHappensTheCursorIsOnARowInTheWindow) {
         const int steps = any::between(1, 30);
         for (int step = 0; step < steps; ++step) {
             switch (any::between(0, 6)) {
-<<<<<<< ours
             case 0: {
                 std::vector<NodeRef> rows;
                 for (const int name : any::integers(0, kNames.size())) {
                     rows.push_back(doubles::leafNode(kNames.at(static_cast<std::size_t>(name)),
                                                      std::string(40, 'v')));
-=======
-            case 0:
-                source.rows.clear();
-                for (const int name : any::integers(0, static_cast<int>(kNames.size()))) {
-                    source.rows.push_back(
-                        leafRow(kNames.at(static_cast<std::size_t>(name)), std::string(40, 'v')));
->>>>>>> theirs
                 }
                 source.show(std::move(rows));
                 table.reloadData();
