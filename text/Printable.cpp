@@ -76,12 +76,12 @@ bool commandsTerminal(char32_t codePoint) {
 }
 
 void appendEscape(std::string& out, char32_t codePoint) {
-    constexpr std::string_view kDigits = "0123456789ABCDEF";
+    constexpr std::string_view kHexDigits = "0123456789ABCDEF";
     constexpr unsigned kBitsPerDigit = 4;
     const bool isAscii = codePoint < kFirstBeyondAscii;
     out += isAscii ? "\\x" : "\\u";
     for (unsigned digits = isAscii ? 2 : 4; digits > 0; --digits) {
-        out += kDigits[(codePoint >> (kBitsPerDigit * (digits - 1))) & 0xFU];
+        out += kHexDigits[(codePoint >> (kBitsPerDigit * (digits - 1))) & 0xFU];
     }
 }
 
