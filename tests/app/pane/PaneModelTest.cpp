@@ -196,7 +196,7 @@ TEST_F(PaneModelTest, WhateverHappensTheCursorIsOnARow) {
             switch (any::between(0, 4)) {
             case 0: {
                 std::vector<NodeRef> rows;
-                for (const int name : any::integers(0, kNames.size())) {
+                for (const int name : any::integers(0, static_cast<int>(kNames.size()))) {
                     rows.push_back(leafNode(kNames.at(static_cast<std::size_t>(name)),
                                             any::boolean() ? "1" : "2"));
                 }

@@ -260,7 +260,7 @@ TEST_F(TerminalTableTest, WhateverHappensTheCursorIsOnARowInTheWindow) {
             switch (any::between(0, 6)) {
             case 0: {
                 std::vector<NodeRef> rows;
-                for (const int name : any::integers(0, kNames.size())) {
+                for (const int name : any::integers(0, static_cast<int>(kNames.size()))) {
                     rows.push_back(doubles::leafNode(kNames.at(static_cast<std::size_t>(name)),
                                                      std::string(40, 'v')));
                 }
