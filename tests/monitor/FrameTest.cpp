@@ -5,6 +5,7 @@
 #include "tests/doubles/Property.h"
 
 #include <gtest/gtest.h>
+#include <rapidcheck.h>
 
 #include <algorithm>
 #include <map>
@@ -270,7 +271,8 @@ TEST_F(FrameTest, TellsWhatComparingAllPathsTells) {
             Paths told = frame->changed();
             std::sort(told.begin(), told.end());
             RC_ASSERT(told == changed);
-            for (const auto& [path, text] : before) {
+            for (const auto& each : before) {
+                const std::string& path = each.first;
                 const bool isTold = std::any_of(
                     frame->gone().begin(), frame->gone().end(), [&path](const auto& gone) {
                         return path == gone || path.starts_with(gone + "/");
