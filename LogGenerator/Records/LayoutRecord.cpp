@@ -56,15 +56,6 @@ bool isPlain(const CodeLayout& code) {
                         [](const ListLayout& list) { return list.sizeCheck.has_value(); });
 }
 
-/// Whether records under the code may have different shapes. Few codes have them, and asking each
-/// record cost a twentieth of the instructions that decode an LTE drive.
-bool hasShapes(const CodeLayout& code) {
-    return std::any_of(code.fields.begin(), code.fields.end(),
-                       [](const Field& field) { return field.condition != nullptr; }) ||
-           std::any_of(code.lists.begin(), code.lists.end(),
-                       [](const ListLayout& list) { return list.staysWithoutEntries; });
-}
-
 void logUnexpectedSizes(const CodeLayout& code, const LogRecord& record) {
     for (const ListLayout& list : code.lists) {
         if (!list.passesSizeCheck(record)) {

@@ -60,8 +60,8 @@ protected:
                                   .queue = queue,
                                   .timers = queue,
                                   .generators = {clock, resources, bundle, standardOutput},
-                                  .technologies = kFakeTechnologies,
-                                  .observer = application});
+                                  .technologies = kFakeTechnologies},
+            application);
     }
     /// One packet, which changes the display; the next tick shows it.
     void receive(const PropertyList& display) {

@@ -310,44 +310,5 @@ TEST(CellEntries, EveryCellOfTheKindHasTheFieldsThatItHolds) {
     EXPECT_EQ(fixture.lines, (Lines{{4, "Entries"}, {3, "no channel\n"}, {3, "no level\n"}}));
 }
 
-// Without a layout
-
-TEST(CellsWithoutALayout, AreTheElementsOfTheArray) {
-    RecordingLog log;
-    const auto readFrom = [](const PropertyList& root) {
-        const Record record = propertyListRecord(kCellMonitor, root);
-        return readCellMonitorArray(LogRecord(record.bytes()));
-    };
-    EXPECT_EQ(readFrom(Array{"no cell"}), Array{"no cell"});
-    EXPECT_EQ(readFrom("a text"), Array());
-    EXPECT_EQ(log.take(), Lines());
-    EXPECT_EQ(readCellMonitorArray(LogRecord()), std::nullopt);
-    EXPECT_EQ(log.lines(), (Lines{{3, "Cell Info Array data could not be constructed"}}));
-}
-
-TEST(CellsWithoutALayout, AreOfATechnologyAndAType) {
-    const auto isServingGsm = [](const PropertyList& element) {
-        return isCell(element, kHXCellMonitorRadioAccessTechnologyGSM,
-                      kHXCellMonitorCellTypeServing);
-    };
-    EXPECT_TRUE(isServingGsm(cell("GSM", "Serving")));
-    EXPECT_FALSE(isServingGsm(cell("UMTS", "Serving")));
-    EXPECT_FALSE(isServingGsm(cell("GSM", "Neighbor")));
-    EXPECT_FALSE(isServingGsm("no cell"));
-}
-
-TEST(CellsWithoutALayout, ShowTheirNumbersAndLogTheMissing) {
-    constexpr auto kNumbers = std::to_array<CellNumber>(
-        {{"Second", "b", "no b\n"}, {"First", "a", "no a\n"}, {"Third", "c", "no c\n"}});
-    RecordingLog log;
-    const auto shown = std::make_shared<Dictionary>();
-    showCellNumbers(shown, kNumbers,
-                    Dictionary{{"c", PropertyList::integer(-3)}, {"b", PropertyList::real(2.0)}});
-    expectInOrder(shown, Dictionary{{"Second", "2"}, {"Third", "-3"}});
-    EXPECT_EQ(log.take(), (Lines{{3, "no a\n"}}));
-    showCellNumbers(nullptr, kNumbers, Dictionary{{"a", PropertyList::integer(1)}});
-    EXPECT_EQ(log.lines(), (Lines{{3, "no b\n"}, {3, "no c\n"}}));
-}
-
 } // namespace
 } // namespace pallax
