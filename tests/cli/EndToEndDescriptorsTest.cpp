@@ -76,9 +76,10 @@ TEST_F(EndToEndDescriptors, StandardOutputDoesNotGoIntoARecording) {
     for (const char* line : {"PALLAX gsm-attach.pcap --print --speed max >>gsm-attach.pcap 2>err",
                              "PALLAX ./gsm-attach.pcap --print >>gsm-attach.pcap 2>err"}) {
         EXPECT_EQ(shell(line), 1) << line;
-        EXPECT_THAT(contentOf(world.path("err")),
-                    testing::MatchesRegex("pallax: Standard output would go into the recording "
-                                          ".*gsm-attach.pcap.\n"));
+        const std::string said = contentOf(world.path("err"));
+        EXPECT_TRUE(said.starts_with("pallax: Standard output would go into the recording "))
+            << said;
+        EXPECT_TRUE(said.ends_with("gsm-attach.pcap.\n")) << said;
     }
     EXPECT_EQ(shell("PALLAX - --print <gsm-attach.pcap >>gsm-attach.pcap 2>err"), 1);
     EXPECT_EQ(contentOf(world.path("err")),

@@ -1,11 +1,7 @@
 #include "LogGenerator/C2K/C2KLogGenerator.h"
-#include "LogGenerator/LTE/LTEClassIndex.h"
-#include "LogGenerator/UTRAN/UTRANClassIndex.h"
-#include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
 #include "reference/ReferenceFiles.h"
 #include "reference/SectionsPage.h"
 #include "tests/doubles/C2KLookupNames.h"
-#include "tests/doubles/FakeStandardOutput.h"
 #include "tests/reference/ReferenceFixture.h"
 
 #include <gtest/gtest.h>
@@ -16,28 +12,13 @@
 namespace pallax {
 namespace {
 
-template <class Index>
-class RecordDescriptions : public testing::Test {};
-using Indexes = testing::Types<LTEClassIndex, UTRANClassIndex, ZOR_GSMClassIndex>;
-TYPED_TEST_SUITE(RecordDescriptions, Indexes);
-
-TYPED_TEST(RecordDescriptions, EveryRecordDescribesTheCodesThatItWants) {
-    doubles::FakeStandardOutput output;
-    const TypeParam index(output);
-    for (const auto& [section, record] : index.classes()) {
-        std::multiset<LogCode> described;
-        for (const CodeDescription& code : record->describe()) {
-            described.insert(code.logCode);
-        }
-        const auto wanted = record->getLogCodeArray();
-        EXPECT_EQ(described, std::multiset<LogCode>(wanted.begin(), wanted.end())) << section;
-    }
-}
-
 TEST(Descriptions, EveryFieldTellsWhereItComesFrom) {
     for (const TechnologyReference& technology : doubles::reference()) {
         for (const SectionReference& section : technology.sections) {
             for (const CodeDescription& code : section.codes) {
+                if (code.showsElements()) {
+                    continue;
+                }
                 for (const FieldDescription& field : code.fields) {
                     const int sources = (field.position ? 1 : 0) + (field.listKey.empty() ? 0 : 1) +
                                         (field.formula.empty() ? 0 : 1);
@@ -52,8 +33,8 @@ TEST(Descriptions, EveryFieldTellsWhereItComesFrom) {
 
 TEST(Descriptions, TheParsersOfCdmaDescribeEveryLookupName) {
     std::set<std::string> described;
-    for (const CodeDescription& code : C2KLogGenerator::describe()) {
-        described.merge(doubles::keysOf(code, true));
+    for (const CodeLayout* layout : C2KLogGenerator::layouts()) {
+        described.merge(doubles::keysOf(describe(*layout), true));
     }
     std::vector<std::string> names = doubles::kLookupNames;
     std::sort(names.begin(), names.end());
