@@ -64,6 +64,26 @@ TEST_F(DisplayDriverTest, TheLiveDisplayIsCaughtUpAndNotGenerated) {
     EXPECT_EQ(generator.displaysMade, 1);
 }
 
+/// Counts on its way out what it was asked until then.
+class CountedGenerator final : public FakeGenerator {
+public:
+    CountedGenerator(const GeneratorEnvironment& environment, int& asked)
+        : FakeGenerator(environment), _asked(asked) {}
+    ~CountedGenerator() override { _asked = caughtUp; }
+
+private:
+    int& _asked;
+};
+
+TEST_F(DisplayDriverTest, WhatAGeneratorHasReceivedIsShownBeforeAnotherTakesItsPlace) {
+    int asked = 0;
+    driver.setGenerator(std::make_unique<CountedGenerator>(
+        GeneratorEnvironment{clock, resources, bundle, output}, asked));
+    driver.update({});
+    setGenerator();
+    EXPECT_EQ(asked, 1);
+}
+
 TEST_F(DisplayDriverTest, TheStateOutlivesTheGenerator) {
     setGenerator().display = "shown";
     EXPECT_FALSE(driver.keepsDisplay());

@@ -20,7 +20,7 @@ std::set<std::string> verbatimSections(const TechnologyReference& technology) {
     std::set<std::string> sections;
     for (const SectionReference& section : technology.sections) {
         for (const CodeDescription& code : section.codes) {
-            if (code.listPart && code.listPart->isEntries() && code.fields.empty()) {
+            if (code.showsElements()) {
                 sections.insert(section.name);
             }
         }

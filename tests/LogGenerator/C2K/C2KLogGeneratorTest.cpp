@@ -333,13 +333,6 @@ TEST_F(C2KLogGeneratorTest, OfPacketsThatReplaceEachOtherTheLatestIsShownWhenSom
     EXPECT_EQ(_generator.display(_state), displayOn("27"));
 }
 
-TEST_F(C2KLogGeneratorTest, ThePacketThatWaitsIsShownBeforeTheGeneratorGoes) {
-    auto generator = C2KLogGenerator::generator(_fixture.environment());
-    generator->updateState(_state, statusOn(25).bytes());
-    generator.reset();
-    EXPECT_EQ(*_state.find("Display"), displayOn("25"));
-}
-
 TEST_F(C2KLogGeneratorTest, APacketThatIsRefusedReplacesNothing) {
     _generator.updateState(_state, statusOn(25).bytes());
     _generator.updateState(_state, statusOn(26).padTo(51).bytes());

@@ -362,12 +362,6 @@ TEST_F(GSMLogGeneratorTest, TheDisplayOfADictionaryIsMadeWhenSomebodyLooks) {
     EXPECT_EQ(*history().back().dictionary()->find("Display"), PropertyList(kExampleDisplay));
 }
 
-TEST_F(GSMLogGeneratorTest, TheDisplayIsMadeBeforeTheGeneratorGoes) {
-    feed(xmlMessage(kExample));
-    generator.reset();
-    EXPECT_EQ(*state.find("Display"), PropertyList(kExampleDisplay));
-}
-
 TEST_F(GSMLogGeneratorTest, AMessageThatIsRefusedLeavesTheDisplayToCome) {
     feed(xmlMessage(kExample));
     EXPECT_EQ(failureOf(bytesOf("{")), kNotDeserialized);
