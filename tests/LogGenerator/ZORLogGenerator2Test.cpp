@@ -252,8 +252,10 @@ TEST_F(ZORLogGenerator2Test, AMissingTemplateLeavesTheDisplayNullAndPacketsAreSt
     Dictionary state;
     RecordingLog log;
     generator.updateState(state, Record(0x4116).prefixed());
-    EXPECT_EQ(log.lines(),
-              (Lines{{3, "Cannot load template for display"}, {6, "Log Header 0x81"}}));
+    EXPECT_EQ(log.lines(), (Lines{{3, "Cannot load template for display"},
+                                  {6, "Log Header 0x81"},
+                                  {4, "first"},
+                                  {4, "second"}}));
     EXPECT_THROW(generator.updateState(state, Record(0x4116).u8(0xEE).bytes()),
                  ArrayOutOfBoundsException)
         << "the records are called";
@@ -270,13 +272,13 @@ TEST_F(ZORLogGenerator2Test, ATemplateWhoseRootIsNoDictionaryCannotBeLoaded) {
 }
 
 TEST_F(ZORLogGenerator2Test, ATemplateKeptInTheStateIsNotLoadedAgain) {
-    _state.set("Template", Dictionary{{"First", Dictionary{{"Code", "none yet"}}}});
+    _state.set("Template", Dictionary{{"First", Dictionary{{"Length", "none yet"}}}});
     (void)_generator.getDisplayFromState(_state);
-    EXPECT_EQ(display(), PropertyList(Dictionary{{"First", Dictionary{{"Code", "none yet"}}}}));
+    EXPECT_EQ(display(), PropertyList(Dictionary{{"First", Dictionary{{"Length", "none yet"}}}}));
     feed(Record(0x4116).bytes());
     EXPECT_EQ(display(), PropertyList(Dictionary{{"First", Dictionary{{"Length", "13"}}}}));
     EXPECT_EQ(*_state.find("Template"),
-              PropertyList(Dictionary{{"First", Dictionary{{"Code", "none yet"}}}}))
+              PropertyList(Dictionary{{"First", Dictionary{{"Length", "none yet"}}}}))
         << "the display is a copy";
 }
 
@@ -316,7 +318,7 @@ TEST_F(ZORLogGenerator2Test, IfASectionNameOccursTwiceTheLastOneProcessedIsTheSe
     _fixture.resources.add("PROBE", Dictionary{{"A", Dictionary{{"First", Dictionary()}}},
                                                {"B", Array{Dictionary{{"First", Dictionary()}}}}});
     feed(Record(0xFF0020).bytes());
-    const PropertyList shown = Dictionary{{"Code", "16711712"}, {"Length", "13"}};
+    const PropertyList shown = Dictionary{{"Length", "13"}};
     EXPECT_EQ(display(), PropertyList(Dictionary{{"A", Dictionary{{"First", Dictionary()}}},
                                                  {"B", Array{Dictionary{{"First", shown}}}}}));
 }
