@@ -1,7 +1,5 @@
 #include "decoding/DisplayOutput.h"
 
-#include "app/tree/PallaxModelNode.h"
-#include "app/tree/ShownEntries.h"
 #include "decoding/DisplayJson.h"
 #include "text/Printable.h"
 
@@ -77,16 +75,6 @@ std::string cellsOf(const PropertyList& value) {
     return cells;
 }
 
-/// Compares without formatting the texts: false does not mean that they differ.
-bool isSameText(const PropertyList& a, const PropertyList& b) {
-    const DisplayNumber* number = a.displayNumber();
-    const DisplayNumber* otherNumber = b.displayNumber();
-    if (number != nullptr && otherNumber != nullptr) {
-        return number->sameNumberAndFormat(*otherNumber);
-    }
-    return a.text() != nullptr && b.text() != nullptr && *a.text() == *b.text();
-}
-
 } // namespace
 
 void JsonOutput::show(const DisplayMoment& moment, const PropertyList& display) {
@@ -113,91 +101,28 @@ CsvOutput::CsvOutput(Output& output, bool withHeader) : _output(output) {
 }
 
 void CsvOutput::show(const DisplayMoment& moment, const PropertyList& display) {
-    ++_display;
-    _before.swap(_order);
-    _order.clear();
     _time = isoTimeText(moment.time);
-    _path = "/";
-    showValue(display);
-    for (auto at = _shown.begin(); at != _shown.end();) {
-        if (at->second.display == _display) {
-            ++at;
-            continue;
-        }
-        writeRow(at->second, kNoCells);
-        at = _shown.erase(at);
-    }
+    _difference.compare(display, *this);
 }
 
-/// Visits the values in the order of the display tree, which keeps only texts.
-void CsvOutput::showValue(const PropertyList& value) {
-    if (const DictionaryRef dictionary = value.dictionary()) {
-        for (const ShownEntry& entry : shownEntries(*dictionary)) {
-            showChild(entry.name, *entry.value);
-        }
-    } else if (const ArrayRef array = value.array()) {
-        int number = 0;
-        for (const PropertyList& element : *array) {
-            if (!element.isNull()) {
-                showChild(std::to_string(number++), element);
-            }
-        }
-    } else if (!value.isNull()) {
-        showLeaf(value);
-    }
-}
-
-void CsvOutput::showChild(std::string_view name, const PropertyList& value) {
-    const std::size_t length = _path.size();
-    const std::size_t lengthWithoutSlashes = _path.find_last_not_of('/') + 1;
-    makeChildPath(_path, name);
-    showValue(value);
-    _path.resize(lengthWithoutSlashes);
-    _path.resize(length, '/');
-}
-
-void CsvOutput::showLeaf(const PropertyList& value) {
-    const auto row = rowOfPath();
-    _order.push_back(row);
-    Shown& shown = row->second;
-    const bool isNew = shown.display == 0;
-    shown.display = _display;
-    if (isNew) {
-        appendCell(shown.pathCell, _path);
-    } else if (isSameText(shown.value, value)) {
-        return;
-    }
+void CsvOutput::changed(std::string_view path, DisplayDifference::Leaf& leaf,
+                        const PropertyList& value) {
     std::string cells = cellsOf(value);
-    if (isNew || shown.cells != cells) {
-        writeRow(shown, cells);
-        shown.cells = std::move(cells);
+    if (leaf.written != cells) {
+        writeRow(path, cells);
+        leaf.written = std::move(cells);
     }
-    shown.value = value;
 }
 
-/// The row of the next node at the path; a new one has no display yet.
-CsvOutput::Rows::iterator CsvOutput::rowOfPath() {
-    if (_order.size() < _before.size()) {
-        const auto next = _before[_order.size()];
-        if (next->first.second == 0 && next->first.first == _path &&
-            next->second.display != _display) {
-            return next;
-        }
-    }
-    std::pair<std::string, int> key(_path, 0);
-    auto row = _shown.try_emplace(key).first;
-    while (row->second.display == _display) {
-        ++key.second;
-        row = _shown.try_emplace(key).first;
-    }
-    return row;
+void CsvOutput::removed(std::string_view path, DisplayDifference::Leaf& /*leaf*/) {
+    writeRow(path, kNoCells);
 }
 
-void CsvOutput::writeRow(const Shown& shown, std::string_view cells) {
+void CsvOutput::writeRow(std::string_view path, std::string_view cells) {
     std::string& text = _output.text();
     text += _time;
     text += ',';
-    text += shown.pathCell;
+    appendCell(text, path);
     text += ',';
     text += cells;
     text += '\n';

@@ -1,15 +1,13 @@
 #pragma once
 
 #include "console/Output.h"
+#include "decoding/DisplayDifference.h"
 #include "plist/PropertyList.h"
 #include "text/Date.h"
 
 #include <cstdint>
-#include <map>
 #include <string>
 #include <string_view>
-#include <utility>
-#include <vector>
 
 namespace pallax {
 
@@ -46,50 +44,28 @@ private:
     Every _every;
 };
 
-/// A table "time,path,value,number,unit" (RFC 4180, lines end in "
-/// "; the header once), with a row for each path of the display tree whose value differs from the
-/// recording's previous display. The rows of one display are in display order, followed by those of
-/// removed paths, by path, with empty value, number and unit. A value that is not a string is
-/// written as in JSON. `number` is the decimal number of a numeric value, and empty for any other
-/// (and if not finite).
-class CsvOutput final : public DisplayOutput {
+/// A table "time,path,value,number,unit" (RFC 4180, lines end in LF; the header once), with a row
+/// for each path of the display tree whose value differs from the recording's previous display. The
+/// rows of one display are in display order, followed by those of removed paths, by path, with
+/// empty value, number and unit. A value that is not a string is written as in JSON. `number` is
+/// the decimal number of a numeric value, and empty for any other (and if not finite).
+class CsvOutput final : public DisplayOutput, private DisplayDifference::Listener {
 public:
     /// Without its header the table continues another one.
     explicit CsvOutput(Output& output, bool withHeader = true);
 
-    void beginRecording() override {
-        _before.clear();
-        _order.clear();
-        _shown.clear();
-    }
+    void beginRecording() override { _difference.clear(); }
     void show(const DisplayMoment& moment, const PropertyList& display) override;
 
 private:
-    struct Shown {
-        PropertyList value;
-        std::string pathCell; ///< the path as CSV
-        std::string cells;    ///< "value,number,unit" as CSV
-        std::uint64_t display = 0;
-    };
-    /// By path and count of earlier nodes with the same path in the display.
-    using Rows = std::map<std::pair<std::string, int>, Shown>;
-
-    /// The value at `_path`.
-    void showValue(const PropertyList& value);
-    void showChild(std::string_view name, const PropertyList& value);
-    void showLeaf(const PropertyList& value);
-    Rows::iterator rowOfPath();
-    void writeRow(const Shown& shown, std::string_view cells);
+    void changed(std::string_view path, DisplayDifference::Leaf& leaf,
+                 const PropertyList& value) override;
+    void removed(std::string_view path, DisplayDifference::Leaf& leaf) override;
+    void writeRow(std::string_view path, std::string_view cells);
 
     Output& _output;
-    Rows _shown;
-    /// The rows of the previous display and of this one in order: the next row is usually the one
-    /// that came next before, so no search is needed.
-    std::vector<Rows::iterator> _before;
-    std::vector<Rows::iterator> _order;
-    std::uint64_t _display = 0;
+    DisplayDifference _difference;
     std::string _time;
-    std::string _path; ///< of the current value
 };
 
 } // namespace pallax
