@@ -102,8 +102,7 @@ double secondsUsedBy(pid_t process) {
 }
 
 void measure(const std::string& recording, int seconds) {
-    ServiceOptions options;
-    options.recording = recording;
+    ServiceOptions options{recordingAt(recording)};
     options.play.loop = true;
     auto service = ChildService::start(options);
     auto directory = SocketDirectory::open();

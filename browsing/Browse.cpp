@@ -45,17 +45,6 @@ struct Request {
     bool isOnScreen;
 };
 
-BrowsedSource sourceOf(const BrowseOptions& options) {
-    if (options.simulation) {
-        return {"simulated " + std::string(options.simulation->technology->commandName)};
-    }
-    if (!options.recording) {
-        return {"live modem"};
-    }
-    return {*options.recording == "-" ? "standard input" : *options.recording,
-            RecordingFile::isStream(*options.recording)};
-}
-
 /// False if the child (null for the machine's own service) ended too early.
 bool browseInPrint(const Request& request, SocketDirectory directory, ChildService* child) {
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
@@ -63,7 +52,7 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     try {
         PrintBrowser browser(std::move(directory), request.onFatalRecord, child,
                              request.settings.afterReconnect, output,
-                             sourceOf(request.options).name);
+                             sourceName(request.options.source));
         isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // the printed text and the generators' notices
@@ -92,7 +81,8 @@ bool browseOnScreen(const Request& request, SocketDirectory directory, ChildServ
     }
     const GuardedTerminal guard;
     ScreenBrowser browser(std::move(directory), request.onFatalRecord, child,
-                          sourceOf(request.options), request.settings, **terminal, notices);
+                          {sourceName(request.options.source), isReadOnce(request.options.source)},
+                          request.settings, **terminal, notices);
     return browser.run();
 }
 
@@ -112,19 +102,21 @@ ExitStatus browse(const Request& request, SocketDirectory directory, ChildServic
     }
     const bool isContented = endChild(*child);
     if (!isWhole) {
-        complain(request.options.simulation ? "The service that simulates the modem has ended."
-                                            : "The service that plays the recording has ended.");
+        complain(recordingPath(request.options.source)
+                     ? "The service that plays the recording has ended."
+                     : "The service that simulates the modem has ended.");
     }
     return isWhole && isContented ? kExitSuccess : kExitFailure;
 }
 
 /// Why the recording cannot be browsed although it can be read; nothing if it can, or if only its
 /// reader can tell (a stream is read once).
-std::optional<std::string> refusalOf(const std::string& path) {
-    if (RecordingFile::isStream(path)) {
+std::optional<std::string> refusalOf(const Source& source) {
+    const auto* file = std::get_if<FileRecording>(&source);
+    if (file == nullptr) {
         return std::nullopt;
     }
-    const Recording::OpenResult recording = Recording::open(path);
+    const Recording::OpenResult recording = Recording::open(file->path);
     if (!recording) {
         return std::nullopt; // the child service reports it, as for an unknown link type
     }
@@ -134,28 +126,25 @@ std::optional<std::string> refusalOf(const std::string& path) {
 /// Starts the requested service. A named stream is opened here, where waiting for it can be
 /// reported, and becomes the child's standard input.
 Result<std::unique_ptr<ChildService>, HostError> startChild(const BrowseOptions& options) {
-    ServiceOptions service;
-    service.recording = options.recording.value_or("");
-    service.play = options.play;
-    service.simulation = options.simulation;
-    if (service.recording.empty() || service.recording == "-" ||
-        !RecordingFile::isStream(service.recording)) {
-        return ChildService::start(std::move(service));
+    const auto* stream = std::get_if<StreamedRecording>(&options.source);
+    if (stream == nullptr || stream->path == "-") {
+        return ChildService::start({options.source, options.play});
     }
-    auto stream = RecordingFile::open(service.recording, complain);
-    if (!stream) {
-        return HostError{stream.error().sentence};
+    auto opened = RecordingFile::open(stream->path, complain);
+    if (!opened) {
+        return HostError{opened.error().sentence};
     }
-    service.inputName = std::exchange(service.recording, "-");
-    return ChildService::start(std::move(service), std::move(stream).value().descriptor);
+    return ChildService::start({StreamedRecording{"-", stream->path}, options.play},
+                               std::move(opened).value().descriptor);
 }
 
 ExitStatus browseWithLog(const Request& request) {
-    const std::optional<std::string>& recording = request.options.recording;
-    if (const auto refusal = recording ? refusalOf(*recording) : std::nullopt) {
+    const Source& source = request.options.source;
+    if (const auto refusal = refusalOf(source)) {
         complain(*refusal);
         return kExitFailure;
     }
+    const auto recording = recordingPath(source);
     if (recording == "-" && ::isatty(STDIN_FILENO) != 0) {
         complain("Standard input is a terminal; pipe a recording into it.");
         return kExitWrongUsage;
@@ -166,7 +155,7 @@ ExitStatus browseWithLog(const Request& request) {
         return kExitFailure;
     }
     std::unique_ptr<ChildService> child;
-    if (recording || request.options.simulation) {
+    if (!std::holds_alternative<ServiceModem>(source)) {
         auto started = startChild(request.options);
         if (!started) {
             complain(started.error().sentence);

@@ -1,17 +1,15 @@
 #pragma once
 
-#include "simulator/Simulation.h"
+#include "sources/Source.h"
 #include "telephony/PacketPlayer.h"
 #include "ui/terminal/CursesTerminal.h"
 
 #include <optional>
-#include <string>
 
 namespace pallax {
 
 struct BrowseOptions {
-    std::optional<std::string> recording;        ///< without one, the live modem
-    std::optional<SimulationOptions> simulation; ///< or a simulated modem
+    Source source;
     PlayOptions play;
     bool print = false;
     terminal::ColorUse color = terminal::ColorUse::Auto;

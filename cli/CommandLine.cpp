@@ -6,7 +6,6 @@
 #include "cli/OptionParts.h"
 #include "cli/SimulateOptions.h"
 #include "cli/Suggestion.h"
-#include "host/RecordingFile.h"
 
 #include <CLI/CLI.hpp>
 
@@ -49,12 +48,11 @@ ParseEnd parseEnd(const CLI::App& app, const CLI::ParseError& error) {
 }
 
 /// Why the recording cannot be restarted, if that is requested; otherwise empty.
-std::string loopRefusal(const std::string& recording, const PlayOptions& play) {
-    if (!play.loop || !RecordingFile::isStream(recording)) {
+std::string loopRefusal(const Source& source, const PlayOptions& play) {
+    if (!play.loop || !isReadOnce(source)) {
         return {};
     }
-    const std::string name = recording == "-" ? "standard input" : recording;
-    return name + " can be played only once, not with --loop";
+    return sourceName(source) + " can be played only once, not with --loop";
 }
 
 /// Adds the help and version flags of every command.
@@ -87,7 +85,7 @@ CommandLine::CommandLine()
     addService(addCommand("service", "Run the telephony service that viewers connect to"),
                _service);
     CLI::App& demo = addCommand("demo", "Browse a simulated modem");
-    addDemo(demo, _demo.simulation.emplace(), _demo.play);
+    addDemo(demo, _demo.source.emplace<SimulationOptions>(), _demo.play);
     addView(demo, _demo);
     addSimulate(addCommand("simulate", "Write a simulated modem's packets to a recording"),
                 _simulate);
@@ -153,11 +151,10 @@ ParsedOptions CommandLine::parse(std::vector<std::string> arguments) {
 }
 
 ParsedOptions CommandLine::chosen() const {
-    if (const auto refusal = loopRefusal(_browse.recording.value_or(""), _browse.play);
-        !refusal.empty()) {
+    if (const auto refusal = loopRefusal(_browse.source, _browse.play); !refusal.empty()) {
         return wrongUsage(refusal);
     }
-    if (const auto refusal = loopRefusal(_service.options.recording, _service.options.play);
+    if (const auto refusal = loopRefusal(_service.options.source, _service.options.play);
         !refusal.empty()) {
         return wrongUsage(refusal, "service");
     }

@@ -118,8 +118,9 @@ void addTechnology(CLI::App& app, const RecordedTechnology*& technology,
 
 void addBrowse(CLI::App& app, BrowseOptions& options) {
     CLI::Option* recording =
-        app.add_option(
-               "RECORDING", options.recording,
+        app.add_option_function<std::string>(
+               "RECORDING",
+               [&options](const std::string& path) { options.source = recordingAt(path); },
                "The recording to browse (pcap or pcapng, a file or a named pipe; - is standard "
                "input; default: the live modem)")
             ->type_name("");

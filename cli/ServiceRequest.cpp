@@ -29,23 +29,23 @@ Exit status:
 
 void addServicePlay(CLI::App& app, ServiceOptions& options) {
     CLI::Option* recording =
-        app.add_option("--play", options.recording, "The recording to play to each client")
+        app.add_option_function<std::string>(
+               "--play",
+               [&options](const std::string& path) { options.source = recordingAt(path); },
+               "The recording to play to each client")
             ->type_name("RECORDING");
     addSpeed(app, options.play);
     app.add_flag("--loop", options.play.loop, "Restart at the end of the recording")
         ->needs(recording);
 }
 
-void addServiceSimulated(CLI::App& app, std::optional<SimulationOptions>& simulation) {
-    addServiceSimulation(app, simulation)->excludes("--play");
-}
-
-void addServiceRelay(CLI::App& app, std::string& relayed, ServiceOptions& options) {
-    const auto take = [&relayed](const std::string& text) {
+void addServiceRelay(CLI::App& app, ServiceOptions& options) {
+    const auto take = [&options](const std::string& text) {
         if (text != "-") {
             throw CLI::ValidationError("--relay", "only -, standard input, can be relayed");
         }
-        relayed = text;
+        options.source = recordingAt(text);
+        options.relay = true;
     };
     app.add_option_function<std::string>(
            "--relay", take, "Relay the live pcap stream on standard input (-) to every client")
@@ -83,8 +83,8 @@ void addServiceStatus(CLI::App& app, bool& status) {
 
 void addService(CLI::App& app, ServiceRequest& request) {
     addServicePlay(app, request.options);
-    addServiceSimulated(app, request.options.simulation);
-    addServiceRelay(app, request.relayed, request.options);
+    addServiceSimulation(app, request.options.source)->excludes("--play");
+    addServiceRelay(app, request.options);
     addServiceStatus(app, request.status);
     app.footer(kServiceFooter);
 }
@@ -93,15 +93,10 @@ ParsedOptions serviceOptions(const ServiceRequest& request) {
     if (request.status) {
         return ServiceStatusOptions();
     }
-    ServiceOptions options = request.options;
-    if (!request.relayed.empty()) {
-        options.recording = request.relayed;
-        options.relay = true;
-    }
-    if (options.recording.empty() && !options.simulation) {
+    if (std::holds_alternative<ServiceModem>(request.options.source)) {
         return wrongUsage("the service needs --play, --simulate, --relay or --status", "service");
     }
-    return options;
+    return request.options;
 }
 
 } // namespace pallax

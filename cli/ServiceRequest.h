@@ -9,7 +9,6 @@ namespace pallax {
 /// What the service should do: play, simulate, relay or print its status, exactly one of them.
 struct ServiceRequest {
     ServiceOptions options;
-    std::string relayed; ///< the stream to relay; empty for none
     bool status = false;
 };
 

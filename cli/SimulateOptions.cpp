@@ -142,16 +142,15 @@ void addSimulate(CLI::App& app, SimulateOptions& options) {
     app.footer(kSimulateFooter);
 }
 
-CLI::Option* addServiceSimulation(CLI::App& app, std::optional<SimulationOptions>& simulation) {
+CLI::Option* addServiceSimulation(CLI::App& app, Source& source) {
+    const auto chosen = [&source]() -> SimulationOptions& {
+        auto* simulation = std::get_if<SimulationOptions>(&source);
+        return simulation != nullptr ? *simulation : source.emplace<SimulationOptions>();
+    };
     CLI::Option* technology = addTechnology(
         app, "--simulate",
-        [&simulation](const RecordedTechnology* named) {
-            simulation.emplace(simulation.value_or(SimulationOptions{})).technology = named;
-        },
+        [chosen](const RecordedTechnology* named) { chosen().technology = named; },
         "The modem to simulate for each viewer");
-    const auto chosen = [&simulation]() -> SimulationOptions& {
-        return simulation ? *simulation : simulation.emplace();
-    };
     addSeed(app, [chosen](std::uint64_t seed) { chosen().seed = seed; })->needs(technology);
     addRate(app, [chosen](unsigned rate) { chosen().packetsPerSecond = rate; })->needs(technology);
     addSeconds(

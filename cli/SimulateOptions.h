@@ -1,10 +1,8 @@
 #pragma once
 
 #include "recording/Simulate.h"
-#include "simulator/Simulation.h"
+#include "sources/Source.h"
 #include "telephony/PacketPlayer.h"
-
-#include <optional>
 
 namespace CLI {
 class App;
@@ -20,7 +18,8 @@ const RecordedTechnology* usualSimulatedTechnology();
 void addDemo(CLI::App& app, SimulationOptions& simulation, PlayOptions& play);
 /// Adds `TECHNOLOGY --seconds N --seed --rate -o FILE`.
 void addSimulate(CLI::App& app, SimulateOptions& options);
-/// Adds `--simulate TECHNOLOGY --seed --rate --seconds`; returns the first.
-CLI::Option* addServiceSimulation(CLI::App& app, std::optional<SimulationOptions>& simulation);
+/// Adds `--simulate TECHNOLOGY --seed --rate --seconds`, which make the source a simulation;
+/// returns the first.
+CLI::Option* addServiceSimulation(CLI::App& app, Source& source);
 
 } // namespace pallax

@@ -1,12 +1,10 @@
 #include "telephony/ChildService.h"
 
-#include "host/Recording.h"
 #include "host/SocketDirectory.h"
 #include "text/Format.h"
 
 #include <climits>
 
-#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <charconv>
@@ -14,6 +12,7 @@
 #include <csignal>
 #include <cstring>
 #include <fcntl.h>
+#include <span>
 #include <sys/prctl.h>
 #include <sys/wait.h>
 #include <thread>
@@ -28,20 +27,7 @@ constexpr int kReadyDescriptor = 3;
 constexpr int kExecFailed = 127;
 
 // The child's arguments, after the program's name.
-enum Argument {
-    kCommand = 1,
-    kControlPort,
-    kSpeed,
-    kLoop,
-    kInterval,
-    kRecording,
-    kInputName,
-    kTechnology, // for a simulation, or empty; then the simulation's numbers
-    kSeed,
-    kRate,
-    kSeconds,
-    kArgumentCount
-};
+enum Argument { kCommand = 1, kControlPort, kSpeed, kLoop, kInterval, kSource };
 constexpr std::string_view kLooping = "loop";
 constexpr std::string_view kOnce = "once";
 
@@ -82,42 +68,36 @@ bool waitUntilReady(const Descriptor& ready) {
 }
 
 std::vector<std::string> argumentsFor(const ServiceOptions& options) {
-    const SimulationOptions simulation = options.simulation.value_or(SimulationOptions{});
-    const auto* technology = simulation.technology;
-    return {"pallax",
-            std::string(kChildServiceCommand),
-            options.controlPortName,
-            speedText(options.play.speed),
-            std::string(options.play.loop ? kLooping : kOnce),
-            std::to_string(options.play.displayInterval.count()),
-            options.recording,
-            options.inputName,
-            technology != nullptr ? std::string(technology->commandName) : std::string(),
-            std::to_string(simulation.seed),
-            std::to_string(simulation.packetsPerSecond),
-            std::to_string(simulation.duration.value_or(std::chrono::seconds(0)).count())};
+    std::vector<std::string> arguments{"pallax",
+                                       std::string(kChildServiceCommand),
+                                       options.controlPortName,
+                                       speedText(options.play.speed),
+                                       std::string(options.play.loop ? kLooping : kOnce),
+                                       std::to_string(options.play.displayInterval.count())};
+    const std::vector<std::string> source = argumentsOf(options.source);
+    arguments.insert(arguments.end(), source.begin(), source.end());
+    return arguments;
 }
 
-template <class Number>
-Number numberOf(const std::string& text) {
-    Number number{};
-    (void)std::from_chars(text.data(), text.data() + text.size(), number);
-    return number;
-}
-
-/// Nothing if the arguments name a recording.
-std::optional<SimulationOptions> simulationOf(const std::vector<std::string>& arguments) {
-    SimulationOptions simulation;
-    simulation.technology = technologyOfCommandName(arguments[kTechnology]);
-    if (simulation.technology == nullptr) {
+/// The options that a parent has written.
+std::optional<ServiceOptions> optionsFrom(std::span<const std::string> arguments) {
+    const auto source =
+        arguments.size() > kSource ? sourceOf(arguments.subspan(kSource)) : std::nullopt;
+    if (!source) {
         return std::nullopt;
     }
-    simulation.seed = numberOf<std::uint64_t>(arguments[kSeed]);
-    simulation.packetsPerSecond = std::max(numberOf<unsigned>(arguments[kRate]), 1U);
-    if (const auto seconds = numberOf<std::int64_t>(arguments[kSeconds]); seconds > 0) {
-        simulation.duration = std::chrono::seconds(seconds);
+    ServiceOptions options{*source};
+    options.controlPortName = arguments[kControlPort];
+    options.play.speed = parseSpeed(arguments[kSpeed]).value_or(1.0);
+    options.play.loop = arguments[kLoop] == kLooping;
+    options.lossless = true; // its only client is the viewer that started it
+    const std::string& interval = arguments[kInterval];
+    std::int64_t count = 0;
+    (void)std::from_chars(interval.data(), interval.data() + interval.size(), count);
+    if (count > 0) {
+        options.play.displayInterval = std::chrono::nanoseconds(count);
     }
-    return simulation;
+    return options;
 }
 
 /// Starts this program again: by its path, which process lists and memory checkers show; if an
@@ -207,7 +187,7 @@ Result<std::unique_ptr<ChildService>, HostError> ChildService::start(ServiceOpti
     pointers.push_back(nullptr);
     Pipe ready = makePipe();
     Pipe complaints = makePipe();
-    const bool readsOurs = !input && options.recording == "-";
+    const bool readsOurs = !input && recordingPath(options.source) == "-";
     const int childsInput = readsOurs ? STDIN_FILENO : input.number();
     const pid_t parent = ::getpid();
     const pid_t process = ready.read && complaints.read ? ::fork() : -1;
@@ -259,23 +239,13 @@ std::string ChildService::takeComplaints() {
 }
 
 int runChildService(int argc, char** argv) {
+    const std::vector<std::string> arguments(argv, argv + argc);
+    const auto options = optionsFrom(arguments);
     // Without a waiting parent, the descriptor would be an unrelated file.
-    if (argc != kArgumentCount || ::fcntl(kReadyDescriptor, F_GETFD) < 0) {
+    if (!options || ::fcntl(kReadyDescriptor, F_GETFD) < 0) {
         return 2;
     }
-    const std::vector<std::string> arguments(argv, argv + argc);
-    ServiceOptions options;
-    options.controlPortName = arguments[kControlPort];
-    options.play.speed = parseSpeed(arguments[kSpeed]).value_or(1.0);
-    options.play.loop = arguments[kLoop] == kLooping;
-    options.recording = arguments[kRecording];
-    options.inputName = arguments[kInputName];
-    options.lossless = true; // its only client is the viewer that started it
-    options.simulation = simulationOf(arguments);
-    if (const auto interval = numberOf<std::int64_t>(arguments[kInterval]); interval > 0) {
-        options.play.displayInterval = std::chrono::nanoseconds(interval);
-    }
-    return runService(options, [] {
+    return runService(*options, [] {
         const Descriptor ready(kReadyDescriptor);
         (void)::fcntl(ready.number(), F_SETFD, FD_CLOEXEC);
         (void)!::write(ready.number(), "+", 1);

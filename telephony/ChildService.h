@@ -21,7 +21,7 @@ inline constexpr std::string_view kChildServiceCommand = "--child-service";
 class ChildService {
 public:
     /// Starts it and waits until clients can connect; fails with the child's error. The control
-    /// port's name in `options` is ignored. For the recording "-", the child reads `input` or this
+    /// port's name in `options` is ignored. For the stream "-", the child reads `input` or this
     /// process's standard input, and this function waits for the stream's header.
     static Result<std::unique_ptr<ChildService>, HostError> start(ServiceOptions options,
                                                                   Descriptor input = Descriptor());

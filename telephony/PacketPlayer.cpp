@@ -35,6 +35,7 @@ PacketPlayer::PacketPlayer(Setup setup)
 void PacketPlayer::play(CodeFilter filter) {
     const bool first = !_filter;
     _filter = std::move(filter);
+    _setup.source.select(*_filter);
     if (first) {
         _setup.queue.async(guarded(&PacketPlayer::step));
     }
@@ -74,6 +75,10 @@ PacketPlayer::Progress PacketPlayer::fetch() {
         } else {
             _setup.source.whenReady(guarded(&PacketPlayer::step));
         }
+        return Progress::Wait;
+    }
+    if (next.state == PacketSource::State::NewTechnology) {
+        flushThen(&PacketPlayer::tellNewTechnology);
         return Progress::Wait;
     }
     if (next.state == PacketSource::State::End) {
@@ -163,6 +168,11 @@ void PacketPlayer::tellEnd() {
         const auto ended = _setup.ended; // which may destroy the player
         ended(_setup.source.failure());
     }
+}
+
+void PacketPlayer::tellNewTechnology() {
+    const auto technologyChanged = _setup.technologyChanged; // which may destroy the player
+    technologyChanged();
 }
 
 void PacketPlayer::tellRunningTime() {

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "host/PortFrame.h"
-#include "telephony/CodeFilter.h"
-#include "telephony/PacketSource.h"
+#include "sources/CodeFilter.h"
+#include "sources/PacketSource.h"
 #include "text/Date.h"
 #include "timeline/StampSequence.h"
 
@@ -51,6 +51,9 @@ public:
         /// Called once at the end, with the source's failure or an empty text.
         std::function<void(const std::string& failure)> ended;
         SteadyNow steadyNow = std::chrono::steady_clock::now;
+        /// Called once when the source has another technology, after what came before has gone to
+        /// the sink; nothing more is played.
+        std::function<void()> technologyChanged = [] {};
     };
 
     /// The references in the setup must outlive the player.
@@ -70,6 +73,7 @@ private:
     void finish();
     void flushThen(void (PacketPlayer::*next)());
     void tellEnd();
+    void tellNewTechnology();
     void tellRunningTime();
     FrameHeader headerOf(FrameKind kind, std::optional<Time> time) const;
     void writeClock(Time time);

@@ -39,7 +39,8 @@ int ServedChannel::open(Setup setup, std::unique_ptr<ServedChannel>& channel) {
             self->_isStreaming = false;
             self->_hasEnded = true;
             ended(failure);
-        }});
+        },
+        std::chrono::steady_clock::now, std::move(setup.technologyChanged)});
     auto local = setup.ports.createLocal(
         setup.portName, [self = made.get()](std::int32_t /*identifier*/, Bytes data) {
             return self->answer(data);

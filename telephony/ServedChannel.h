@@ -1,7 +1,7 @@
 #pragma once
 
+#include "sources/PacketSource.h"
 #include "telephony/PacketPlayer.h"
-#include "telephony/PacketSource.h"
 #include "telephony/ServiceStatus.h"
 #include "telephony/SocketSink.h"
 
@@ -15,7 +15,8 @@ class LocalMessagePort;
 class SocketMessagePorts;
 
 /// One log channel of the service: answers GetTechnology on its port, and streams to its client
-/// after the start command. It lasts until the client closes the connection that it feeds.
+/// after the start command. It lasts until the client closes the connection that it feeds, or the
+/// source has another technology.
 class ServedChannel {
 public:
     struct Setup {
@@ -31,6 +32,8 @@ public:
         std::function<void(const std::string& sentence)> report;
         /// The client has gone; may destroy the channel.
         std::function<void()> closed;
+        /// The source has another technology; may destroy the channel, whose client then asks anew.
+        std::function<void()> technologyChanged;
         /// The source has ended, with its failure or an empty text.
         std::function<void(const std::string& failure)> ended;
     };

@@ -2,17 +2,11 @@
 
 #include "host/AsioMainQueue.h"
 #include "host/Complaint.h"
-#include "host/Descriptor.h"
 #include "host/Interruption.h"
 #include "host/SocketMessagePorts.h"
-#include "telephony/RecordingSource.h"
-#include "telephony/Relay.h"
+#include "sources/SourceFactory.h"
 #include "telephony/ServiceStatus.h"
-#include "telephony/SimulatedSource.h"
-#include "telephony/StreamOpening.h"
-#include "telephony/StreamSource.h"
 #include "telephony/TelephonyServer.h"
-#include "text/Format.h"
 
 #include <array>
 #include <cerrno>
@@ -20,9 +14,7 @@
 #include <cmath>
 #include <csignal>
 #include <cstdio>
-#include <fcntl.h>
 #include <memory>
-#include <sys/file.h>
 
 namespace pallax {
 
@@ -30,79 +22,12 @@ namespace {
 
 constexpr std::string_view kAsFastAsTakenText = "max";
 
-/// The service's technology, and its sources, one for each channel.
-struct Program {
-    std::string technology;
-    PacketSourceFactory makeSource;
-    std::shared_ptr<Relay> relay; ///< null unless the source is a live stream
-    Descriptor reading{};         ///< keeps recorders from replacing the recording being played
-};
-
-/// A recording that is still being written is played anyway.
-Descriptor lockForReading(const std::string& path) {
-    Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
-    (void)::flock(file.number(), LOCK_SH | LOCK_NB);
-    return file;
-}
-
-Result<std::unique_ptr<PacketSource>, HostError> takeOnce(std::unique_ptr<PacketSource>& stream,
-                                                          const std::string& name) {
-    if (stream == nullptr) {
-        return HostError{formatText("%@ is already being played.", {name})};
-    }
-    return std::move(stream);
-}
-
-/// Fails at once if no channel could play it. `relayEnded` is called after a live stream's end.
-Result<Program, HostError> programOf(const ServiceOptions& options, AsioMainQueue& queue,
-                                     std::function<void(bool isOrderly)> relayEnded) {
-    if (options.simulation) {
-        const SimulationOptions simulation = *options.simulation;
-        return Program{std::string(simulation.technology->identifier),
-                       [simulation]() -> Result<std::unique_ptr<PacketSource>, HostError> {
-                           return std::unique_ptr<PacketSource>(
-                               std::make_unique<SimulatedSource>(simulation));
-                       },
-                       nullptr};
-    }
-    const auto open = [&options] {
-        return openKnownRecording({options.recording, options.inputName, complain});
-    };
-    auto recording = options.relay ? openStream({open, complain}) : open();
-    if (!recording) {
-        return recording.error();
-    }
-    Program program;
-    program.technology = (*recording)->technology()->identifier;
-    if (!(*recording)->isStream()) {
-        program.makeSource = [path = options.recording] { return RecordingSource::open(path); };
-        program.reading = lockForReading(options.recording);
-        return program;
-    }
-    const auto stream = std::make_shared<std::unique_ptr<PacketSource>>(
-        std::make_unique<StreamSource>(queue, std::move(recording).value()));
-    if (!options.relay) {
-        const std::string path = options.recording == "-" ? "Standard input" : options.recording;
-        const std::string name = options.inputName.empty() ? path : options.inputName;
-        program.makeSource = [stream, name] { return takeOnce(*stream, name); };
-        return program;
-    }
-    Relay::Setup relay{queue, queue, std::move(*stream), complain, std::move(relayEnded)};
-    relay.patience = options.relayPatience;
-    program.relay = std::make_shared<Relay>(std::move(relay));
-    program.makeSource = [relay =
-                              program.relay]() -> Result<std::unique_ptr<PacketSource>, HostError> {
-        return relay->source();
-    };
-    return program;
-}
-
 /// The buffering and the pace of the channels.
 TelephonyServer::Setup serverSetup(const ServiceOptions& options, AsioMainQueue& queue,
-                                   SocketMessagePorts& ports, const Program& program) {
-    TelephonyServer::Setup setup{queue,        ports,   options.controlPortName, program.makeSource,
+                                   SocketMessagePorts& ports, const OpenSource& source) {
+    TelephonyServer::Setup setup{queue,        ports,   options.controlPortName, source.makeReader,
                                  options.play, complain};
-    setup.technology = program.technology;
+    setup.technology = source.technology;
     if (options.relay) {
         setup.options.speed = PlayOptions::kAsFastAsTaken; // the stream sets the pace
         setup.options.live = true;
@@ -156,16 +81,20 @@ int serve(const ServiceOptions& options, const std::function<void()>& ready,
     LastWords lastWords(queue);
     std::unique_ptr<TelephonyServer> server;
     int status = 0;
-    const auto program = programOf(options, queue, [&](bool isOrderly) {
-        status = isOrderly ? 0 : 1;
-        lastWords.begin(*server);
-    });
-    if (!program) {
-        complain(program.error().sentence);
+    SourceSurroundings surroundings{queue, complain};
+    if (options.relay) {
+        surroundings.relaying = {options.relayPatience, [&](bool isOrderly) {
+                                     status = isOrderly ? 0 : 1;
+                                     lastWords.begin(*server);
+                                 }};
+    }
+    const auto source = openSource(options.source, std::move(surroundings));
+    if (!source) {
+        complain(source.error().sentence);
         return 1;
     }
     queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [&queue](int /*signal*/) { queue.stop(); });
-    auto started = TelephonyServer::start(serverSetup(options, queue, ports, *program));
+    auto started = TelephonyServer::start(serverSetup(options, queue, ports, *source));
     if (!started) {
         complain(started.error().sentence);
         return 1;

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "simulator/Simulation.h"
+#include "sources/Source.h"
 #include "telephony/ControlMessages.h"
 #include "telephony/PacketPlayer.h"
 
@@ -16,18 +16,15 @@ namespace pallax {
 struct ServiceOptions {
     static constexpr std::chrono::seconds kRelayPatience{10};
 
-    /// Path, "-" for standard input; a stream is played once, to the first channel.
-    std::string recording;
-    std::string inputName = {}; ///< the name of standard input in messages; empty: the default
-    PlayOptions play;
+    Source source; ///< not the service's modem; a stream is played once, to the first channel
+    PlayOptions play = {};
     std::string controlPortName = std::string(kTelephonyControlPort);
-    /// The recording is a live stream: every client gets it live, and the service ends with it.
+    /// The source is a live stream: every client gets it live, and the service ends with it.
     bool relay = false;
     /// How long a relayed stream waits for its first client.
     std::chrono::nanoseconds relayPatience = kRelayPatience;
     /// Every client sets its own pace and loses nothing, at any speed.
     bool lossless = false;
-    std::optional<SimulationOptions> simulation = {}; ///< instead of a recording
 };
 
 /// "1.5", "max": a speed as in the options.

@@ -85,6 +85,7 @@ LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
                              std::move(source).value(), _setup.options, _setup.mostWaiting,
                              [this](const std::string& sentence) { report(sentence); },
                              [this, number] { removeChannel(number); },
+                             [this, number] { removeChannel(number); },
                              [this](const std::string& failure) {
                                  if (!failure.empty()) {
                                      report(failure);

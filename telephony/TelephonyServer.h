@@ -1,9 +1,9 @@
 #pragma once
 
 #include "host/HostError.h"
+#include "sources/PacketSource.h"
 #include "telephony/ControlMessages.h"
 #include "telephony/PacketPlayer.h"
-#include "telephony/PacketSource.h"
 #include "telephony/ServiceStatus.h"
 #include "text/Bytes.h"
 #include "text/Result.h"

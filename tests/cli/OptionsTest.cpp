@@ -29,7 +29,7 @@ ParseEnd ended(std::vector<std::string> arguments) {
 
 TEST(Options, WithoutArgumentsTheLiveModemIsBrowsed) {
     const auto options = parsed<BrowseOptions>({});
-    EXPECT_EQ(options.recording, std::nullopt);
+    EXPECT_TRUE(std::holds_alternative<ServiceModem>(options.source));
     EXPECT_EQ(options.play.speed, 1.0);
     EXPECT_FALSE(options.play.loop);
     EXPECT_FALSE(options.keepGoing);
@@ -39,7 +39,7 @@ TEST(Options, WithoutArgumentsTheLiveModemIsBrowsed) {
 TEST(Options, ARecordingIsBrowsed) {
     const auto options = parsed<BrowseOptions>(
         {"drive.pcap", "--print", "--speed", "2.5", "--loop", "--keep-going", "--log-level", "4"});
-    EXPECT_EQ(options.recording, "drive.pcap");
+    EXPECT_EQ(recordingPath(options.source), "drive.pcap");
     EXPECT_TRUE(options.print);
     EXPECT_EQ(options.play.speed, 2.5);
     EXPECT_TRUE(options.play.loop);
@@ -47,7 +47,7 @@ TEST(Options, ARecordingIsBrowsed) {
     EXPECT_EQ(options.logLevel, 4);
     EXPECT_EQ(parsed<BrowseOptions>({"--speed", "max", "-"}).play.speed,
               PlayOptions::kAsFastAsTaken);
-    EXPECT_EQ(parsed<BrowseOptions>({"-"}).recording, "-");
+    EXPECT_EQ(recordingPath(parsed<BrowseOptions>({"-"}).source), "-");
 }
 
 TEST(Options, ColourAndMouseAreTheTerminalsUnlessToldOtherwise) {
@@ -67,7 +67,7 @@ TEST(Options, ColourAndMouseAreTheTerminalsUnlessToldOtherwise) {
 }
 
 TEST(Options, ARecordingNamedLikeACommandIsGivenWithItsFolder) {
-    EXPECT_EQ(parsed<BrowseOptions>({"./decode"}).recording, "./decode");
+    EXPECT_EQ(recordingPath(parsed<BrowseOptions>({"./decode"}).source), "./decode");
 }
 
 TEST(Options, DecodeWritesTheLastDisplayAsJsonUnlessToldOtherwise) {
@@ -103,14 +103,14 @@ TEST(Options, DecodeTakesEveryTechnology) {
 TEST(Options, ServicePlaysARecording) {
     const auto options =
         parsed<ServiceOptions>({"service", "--play", "a.pcap", "--speed", "max", "--loop"});
-    EXPECT_EQ(options.recording, "a.pcap");
+    EXPECT_EQ(recordingPath(options.source), "a.pcap");
     EXPECT_EQ(options.play.speed, PlayOptions::kAsFastAsTaken);
     EXPECT_TRUE(options.play.loop);
 }
 
 TEST(Options, ServiceRelaysStandardInput) {
     const auto options = parsed<ServiceOptions>({"service", "--relay", "-"});
-    EXPECT_EQ(options.recording, "-");
+    EXPECT_EQ(recordingPath(options.source), "-");
     EXPECT_TRUE(options.relay);
     EXPECT_EQ(options.relayPatience, std::chrono::seconds(10));
     EXPECT_FALSE(parsed<ServiceOptions>({"service", "--play", "-"}).relay);
@@ -151,35 +151,33 @@ TEST(Options, RecordWritesOneFileAndKeepsWhatExistsUnlessToldOtherwise) {
 TEST(Options, ServiceSimulatesAModem) {
     const auto options = parsed<ServiceOptions>(
         {"service", "--simulate", "lte", "--seed", "18446744073709551615", "--rate", "50"});
-    ASSERT_TRUE(options.simulation);
-    EXPECT_EQ(options.simulation->technology->commandName, "lte");
-    EXPECT_EQ(options.simulation->seed, 18446744073709551615U);
-    EXPECT_EQ(options.simulation->packetsPerSecond, 50U);
-    EXPECT_EQ(options.recording, "");
-    EXPECT_EQ(options.simulation->duration, std::nullopt);
+    const auto& optionsDrive = std::get<SimulationOptions>(options.source);
+    EXPECT_EQ(optionsDrive.technology->commandName, "lte");
+    EXPECT_EQ(optionsDrive.seed, 18446744073709551615U);
+    EXPECT_EQ(optionsDrive.packetsPerSecond, 50U);
+    EXPECT_EQ(optionsDrive.duration, std::nullopt);
     EXPECT_EQ(options.play.speed, 1.0);
     EXPECT_EQ(ended({"service", "--simulate", "lte", "--play", "a"}).status, kExitWrongUsage);
     const auto brief = parsed<ServiceOptions>(
         {"service", "--simulate", "ifx", "--seconds", "60", "--speed", "max"});
-    EXPECT_EQ(brief.simulation->duration, std::chrono::seconds(60));
+    EXPECT_EQ(std::get<SimulationOptions>(brief.source).duration, std::chrono::seconds(60));
     EXPECT_EQ(brief.play.speed, PlayOptions::kAsFastAsTaken);
 }
 
 TEST(Options, DemoBrowsesASimulatedModemOfLteUnlessAnotherIsNamed) {
     const auto plain = parsed<BrowseOptions>({"demo"});
-    ASSERT_TRUE(plain.simulation);
-    EXPECT_EQ(plain.recording, std::nullopt);
-    EXPECT_EQ(plain.simulation->technology->commandName, "lte");
-    EXPECT_EQ(plain.simulation->seed, 1U);
-    EXPECT_EQ(plain.simulation->packetsPerSecond, 40U);
-    EXPECT_EQ(plain.simulation->duration, std::nullopt) << "it never ends";
+    const auto& plainDrive = std::get<SimulationOptions>(plain.source);
+    EXPECT_EQ(plainDrive.technology->commandName, "lte");
+    EXPECT_EQ(plainDrive.seed, 1U);
+    EXPECT_EQ(plainDrive.packetsPerSecond, 40U);
+    EXPECT_EQ(plainDrive.duration, std::nullopt) << "it never ends";
     const auto told =
         parsed<BrowseOptions>({"demo", "gsm", "--seed", "7", "--speed", "max", "--seconds", "60",
                                "--print", "--no-mouse", "--keep-going", "--log-level", "3"});
-    ASSERT_TRUE(told.simulation);
-    EXPECT_EQ(told.simulation->technology->commandName, "gsm");
-    EXPECT_EQ(told.simulation->seed, 7U);
-    EXPECT_EQ(told.simulation->duration, std::chrono::seconds(60));
+    const auto& toldDrive = std::get<SimulationOptions>(told.source);
+    EXPECT_EQ(toldDrive.technology->commandName, "gsm");
+    EXPECT_EQ(toldDrive.seed, 7U);
+    EXPECT_EQ(toldDrive.duration, std::chrono::seconds(60));
     EXPECT_EQ(told.play.speed, PlayOptions::kAsFastAsTaken);
     EXPECT_TRUE(told.print);
     EXPECT_FALSE(told.mouse);
@@ -334,7 +332,7 @@ TEST(Options, AMistypedCommandOrChoiceIsAnsweredWithTheNearest) {
     EXPECT_EQ(wrongUsage({"decode", "--every", "tcik", "a"}),
               "pallax: --every: \"tcik\" is not one of end|tick|packet. Did you mean \"tick\"? "
               "(see pallax decode --help)\n");
-    EXPECT_EQ(parsed<BrowseOptions>({"drive"}).recording, "drive") << "near to nothing";
+    EXPECT_EQ(recordingPath(parsed<BrowseOptions>({"drive"}).source), "drive") << "near to nothing";
 }
 
 TEST(Options, ARecordingNamedNearlyLikeACommandIsBrowsed) {
@@ -343,7 +341,7 @@ TEST(Options, ARecordingNamedNearlyLikeACommandIsBrowsed) {
     std::filesystem::create_directories(folder);
     std::filesystem::current_path(folder);
     std::ofstream("decod") << "a recording";
-    EXPECT_EQ(parsed<BrowseOptions>({"decod"}).recording, "decod");
+    EXPECT_EQ(recordingPath(parsed<BrowseOptions>({"decod"}).source), "decod");
     std::filesystem::current_path(here);
     std::filesystem::remove_all(folder);
 }

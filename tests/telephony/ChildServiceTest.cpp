@@ -17,17 +17,14 @@ using namespace std::chrono_literals;
 class ChildServiceTest : public testing::Test {
 protected:
     std::unique_ptr<ChildService> start(const std::string& recording) {
-        ServiceOptions options;
-        options.recording = recording;
+        ServiceOptions options{recordingAt(recording)};
         options.play.speed = PlayOptions::kAsFastAsTaken;
         auto service = ChildService::start(options);
         EXPECT_TRUE(service) << service.error().sentence;
         return service ? std::move(service).value() : nullptr;
     }
     std::string failure(const std::string& recording) {
-        ServiceOptions options;
-        options.recording = recording;
-        const auto service = ChildService::start(options);
+        const auto service = ChildService::start({recordingAt(recording)});
         return service ? "" : service.error().sentence;
     }
     /// Connects as a viewer, streams everything and counts the packets.

@@ -29,11 +29,14 @@ public:
             return {State::Later, std::nullopt};
         }
         if (_next == _items.size()) {
-            return {State::End, std::nullopt};
+            return {changesTechnology ? State::NewTechnology : State::End, std::nullopt};
         }
         const Item& item = _items[_next++];
         _data = {1, 0, 0, item.code, 0};
         return {State::Packet, Packet{Time(kFirst + item.time), _data, item.isOutOfRange}};
+    }
+    void select(const CodeFilter& wanted) override {
+        selected.push_back(wanted.wants(ByteBuffer{1, 0, 0, 5, 0}) ? "with 5" : "without 5");
     }
     void whenReady(std::function<void()> callback) override { ready = std::move(callback); }
     bool restart() override {
@@ -44,6 +47,8 @@ public:
 
     static constexpr std::size_t kNever = static_cast<std::size_t>(-1);
     bool canRestart = true;
+    bool changesTechnology = false; ///< at its end
+    std::vector<std::string> selected;
     std::size_t holdBackAt = kNever; ///< the packet that has not come yet
     std::string broken;
     std::function<void()> ready;
@@ -139,6 +144,33 @@ TEST_F(PacketPlayerTest, KeepsTheSourcesTimingAndReachesTheTickAfterTheLastPacke
         (Diary(_sink.diary.begin() + 4, _sink.diary.end())),
         (Diary{"1300: clock at 1300", "1800: clock at 1800", "2000: clock at 2000", "2000: end"}));
     EXPECT_EQ(_ended, (std::vector<std::string>{""}));
+}
+
+TEST_F(PacketPlayerTest, TheSourceIsToldWhatIsWanted) {
+    play({{0ms, 1}});
+    EXPECT_EQ(_source->selected, (std::vector<std::string>{"with 5"})) << "before it is asked";
+    _player->play(*CodeFilter::fromStartCommand({{"SetState", "Streaming"}}, false));
+    EXPECT_EQ(_source->selected, (std::vector<std::string>{"with 5", "without 5"}));
+}
+
+TEST_F(PacketPlayerTest, ANewTechnologyEndsThePlayAfterWhatCameBefore) {
+    _source.emplace(std::vector<ListSource::Item>{{0ms, 1}});
+    _source->changesTechnology = true;
+    int changes = 0;
+    _player.emplace(
+        PacketPlayer::Setup{_queue, *_source, _sink, at(PlayOptions::kAsFastAsTaken),
+                            [this](const std::string& failure) { _ended.push_back(failure); },
+                            [this] { return std::chrono::steady_clock::time_point(_queue.now()); },
+                            [&] {
+                                ++changes;
+                                EXPECT_EQ(_sink.pending(), 0U);
+                                _player.reset(); // as the channel does
+                            }});
+    _player->play(everything());
+    _queue.advance(10s);
+    EXPECT_EQ(changes, 1);
+    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0"}));
+    EXPECT_EQ(_ended, std::vector<std::string>());
 }
 
 TEST_F(PacketPlayerTest, SpeedScalesTheWallTimeAndNotTheSourceTime) {

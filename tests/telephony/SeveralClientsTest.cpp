@@ -1,6 +1,6 @@
 #include "host/SourceClock.h"
 #include "host/WallClock.h"
-#include "telephony/RecordingSource.h"
+#include "sources/RecordingSource.h"
 #include "telephony/SocketTelephonyService.h"
 #include "telephony/TelephonyServer.h"
 #include "tests/telephony/ServiceFolder.h"

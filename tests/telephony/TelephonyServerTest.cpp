@@ -2,7 +2,7 @@
 
 #include "host/SourceClock.h"
 #include "host/WallClock.h"
-#include "telephony/RecordingSource.h"
+#include "sources/RecordingSource.h"
 #include "telephony/SocketTelephonyService.h"
 #include "tests/doubles/SteppedQueue.h"
 #include "tests/telephony/ServiceFolder.h"
@@ -142,6 +142,45 @@ TEST_F(TelephonyServerTest, TheServersEndInvalidatesTheClientsPorts) {
     _server.reset();
     EXPECT_TRUE(runUntil(_queue, [&] { return !remote->isValid(); }));
     EXPECT_EQ(_folder.socketCount(), 1U); // the viewer's own
+}
+
+/// A modem that speaks GSM, sends one packet, and then speaks LTE.
+class ChangingSource final : public PacketSource {
+public:
+    std::string technology() const override { return _asked > 1 ? "Zorell_LTE" : "Zorell_GSM"; }
+    Next next() override {
+        ++_asked;
+        return _asked == 1 ? Next{State::Packet, Packet{kRecordingStart, _packet}}
+                           : Next{State::NewTechnology, std::nullopt};
+    }
+    void whenReady(std::function<void()> /*ready*/) override {}
+    bool restart() override { return false; }
+    std::string failure() const override { return {}; }
+
+private:
+    int _asked = 0;
+    ByteBuffer _packet = logRecord(1, 1);
+};
+
+TEST_F(TelephonyServerTest, AChannelEndsWhenItsSourceHasAnotherTechnology) {
+    auto server = TelephonyServer::start(
+        {_other.queue,
+         _serverPorts,
+         std::string(kTelephonyControlPort),
+         []() -> Result<std::unique_ptr<PacketSource>, HostError> {
+             return std::unique_ptr<PacketSource>(std::make_unique<ChangingSource>());
+         },
+         {PlayOptions::kAsFastAsTaken, false, 2s},
+         [this](const std::string& sentence) { _reports.push_back(sentence); }});
+    ASSERT_TRUE(server);
+    _server = std::move(server).value();
+    const auto remote = _ports.createRemote(openChannel().remotePortName.value_or(""));
+    ASSERT_EQ(send(*remote, startCommand(1), false).error, SendError::None);
+    EXPECT_TRUE(runUntil(_queue, [&] { return !remote->isValid(); })) << "so its client asks anew";
+    EXPECT_EQ(_codes, std::vector<int>{1}) << "what came before has arrived";
+    _other.end();
+    EXPECT_EQ(_server->channelCount(), 0U);
+    EXPECT_EQ(_reports, std::vector<std::string>());
 }
 
 TEST_F(TelephonyServerTest, ANameThatIsTakenIsAClearFailure) {

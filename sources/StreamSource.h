@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/Recording.h"
-#include "telephony/PacketSource.h"
+#include "sources/PacketSource.h"
 
 namespace pallax {
 

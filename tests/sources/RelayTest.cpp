@@ -1,4 +1,4 @@
-#include "telephony/Relay.h"
+#include "sources/Relay.h"
 
 #include "tests/doubles/SteppedQueue.h"
 

@@ -2,7 +2,7 @@
 
 #include "host/HostError.h"
 #include "host/Recording.h"
-#include "telephony/Relay.h"
+#include "sources/Relay.h"
 #include "text/Result.h"
 
 #include <chrono>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "telephony/PacketSource.h"
+#include "sources/PacketSource.h"
 
 #include <chrono>
 #include <cstdint>

@@ -1,4 +1,4 @@
-#include "telephony/SimulatedSource.h"
+#include "sources/SimulatedSource.h"
 
 #include "host/Recording.h"
 

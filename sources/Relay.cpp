@@ -1,4 +1,4 @@
-#include "telephony/Relay.h"
+#include "sources/Relay.h"
 
 #include "platform/MainQueue.h"
 #include "platform/RepeatingTimer.h"
@@ -132,7 +132,7 @@ void Relay::step() {
             _setup.stream->whenReady(again);
             return;
         }
-        if (next.state == PacketSource::State::End) {
+        if (next.state != PacketSource::State::Packet) { // streams have one technology
             finish();
             return;
         }

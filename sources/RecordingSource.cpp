@@ -1,4 +1,4 @@
-#include "telephony/RecordingSource.h"
+#include "sources/RecordingSource.h"
 
 namespace pallax {
 

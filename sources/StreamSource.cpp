@@ -1,4 +1,4 @@
-#include "telephony/StreamSource.h"
+#include "sources/StreamSource.h"
 
 #include "platform/MainQueue.h"
 

@@ -12,8 +12,10 @@
 
 namespace pallax {
 
-/// The source of a log channel's packets: a recording, a stream, a simulated modem. Used only on
-/// the main queue.
+class CodeFilter;
+
+/// A reader of a source's packets: of a recording, a stream, a simulated modem. Used only on the
+/// main queue.
 class PacketSource {
 public:
     struct Packet {
@@ -23,8 +25,9 @@ public:
         bool isOutOfRange = false;
     };
     enum class State {
-        Packet, ///< `packet` is set
-        Later,  ///< nothing yet: use `whenReady`
+        Packet,        ///< `packet` is set
+        Later,         ///< nothing yet: use `whenReady`
+        NewTechnology, ///< `technology` has another answer, which later packets are of
         End
     };
     struct Next {
@@ -35,6 +38,9 @@ public:
     virtual ~PacketSource() = default;
     /// The answer to GetTechnology.
     virtual std::string technology() const = 0;
+    /// Tells which log codes are wanted from now on. A modem need not send others; a recording
+    /// gives every packet, since all their times count.
+    virtual void select(const CodeFilter& /*wanted*/) {}
     virtual Next next() = 0;
     /// After Later: calls `ready` once, as a block of the main queue, when `next` has a new result.
     virtual void whenReady(std::function<void()> ready) = 0;

@@ -1,4 +1,4 @@
-#include "telephony/StreamOpening.h"
+#include "sources/StreamOpening.h"
 
 #include <gtest/gtest.h>
 

@@ -1,4 +1,4 @@
-#include "telephony/CodeFilter.h"
+#include "sources/CodeFilter.h"
 
 #include "plist/PropertyList.h"
 

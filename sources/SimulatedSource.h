@@ -1,7 +1,7 @@
 #pragma once
 
 #include "simulator/Simulation.h"
-#include "telephony/PacketSource.h"
+#include "sources/PacketSource.h"
 
 namespace pallax {
 

@@ -1,4 +1,4 @@
-#include "telephony/CodeFilter.h"
+#include "sources/CodeFilter.h"
 
 #include "LogGenerator/LogPacket.h"
 #include "plist/PropertyList.h"

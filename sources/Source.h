@@ -1,0 +1,44 @@
+#pragma once
+
+#include "simulator/Simulation.h"
+
+#include <optional>
+#include <span>
+#include <string>
+#include <variant>
+#include <vector>
+
+namespace pallax {
+
+/// The modem behind this machine's telephony service.
+struct ServiceModem {};
+
+/// A recording in a file, which each reader reads from its start.
+struct FileRecording {
+    std::string path;
+};
+
+/// A recording that can be read once, usually while it is written.
+struct StreamedRecording {
+    std::string path;      ///< a named pipe; "-" is standard input
+    std::string name = {}; ///< for messages; if empty, the path
+};
+
+/// Where packets come from. A simulated modem is named by its options.
+using Source = std::variant<ServiceModem, FileRecording, StreamedRecording, SimulationOptions>;
+
+/// The recording at a path of the command line.
+Source recordingAt(std::string path);
+
+/// The path of a recording; nothing for a modem.
+std::optional<std::string> recordingPath(const Source& source);
+/// "drive.pcap", "standard input", "live modem", "simulated lte".
+std::string sourceName(const Source& source);
+bool isReadOnce(const Source& source);
+
+/// The source as arguments of a command, its kind first.
+std::vector<std::string> argumentsOf(const Source& source);
+/// The source that the arguments stand for; nothing if they stand for none.
+std::optional<Source> sourceOf(std::span<const std::string> arguments);
+
+} // namespace pallax

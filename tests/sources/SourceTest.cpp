@@ -1,0 +1,109 @@
+#include "sources/Source.h"
+
+#include "host/Recording.h"
+#include "tests/doubles/Files.h"
+#include "tests/doubles/Property.h"
+
+#include <gtest/gtest.h>
+
+#include <sys/stat.h>
+
+namespace pallax {
+namespace {
+
+using Arguments = std::vector<std::string>;
+
+SimulationOptions drive(std::string_view technology) {
+    SimulationOptions options;
+    options.technology = technologyOfCommandName(technology);
+    return options;
+}
+
+TEST(Source, APathLeadsToAFileOrToAStream) {
+    const doubles::TemporaryFolder folder;
+    const std::string pipe = folder.path("pipe");
+    ASSERT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
+    EXPECT_TRUE(std::holds_alternative<FileRecording>(recordingAt(folder.write("file", "a"))));
+    EXPECT_TRUE(std::holds_alternative<FileRecording>(recordingAt(folder.path("missing"))));
+    EXPECT_TRUE(std::holds_alternative<StreamedRecording>(recordingAt(pipe)));
+    EXPECT_TRUE(std::holds_alternative<StreamedRecording>(recordingAt("-")));
+    EXPECT_EQ(recordingPath(recordingAt(pipe)), pipe);
+    EXPECT_EQ(recordingPath(recordingAt("a.pcap")), "a.pcap");
+    EXPECT_EQ(recordingPath(ServiceModem()), std::nullopt);
+    EXPECT_EQ(recordingPath(drive("lte")), std::nullopt);
+}
+
+TEST(Source, HasANameForMessages) {
+    EXPECT_EQ(sourceName(ServiceModem()), "live modem");
+    EXPECT_EQ(sourceName(FileRecording{"a/drive.pcap"}), "a/drive.pcap");
+    EXPECT_EQ(sourceName(StreamedRecording{"-"}), "standard input");
+    EXPECT_EQ(sourceName(StreamedRecording{"/dev/fd/63"}), "/dev/fd/63");
+    EXPECT_EQ(sourceName(StreamedRecording{"-", "pipe"}), "pipe");
+    EXPECT_EQ(sourceName(drive("cdma")), "simulated cdma");
+}
+
+TEST(Source, OnlyAStreamIsReadOnce) {
+    EXPECT_TRUE(isReadOnce(StreamedRecording{"-"}));
+    EXPECT_FALSE(isReadOnce(FileRecording{"a"}));
+    EXPECT_FALSE(isReadOnce(ServiceModem()));
+    EXPECT_FALSE(isReadOnce(drive("lte")));
+}
+
+TEST(Source, IsWrittenAsArguments) {
+    EXPECT_EQ(argumentsOf(ServiceModem()), (Arguments{"service"}));
+    EXPECT_EQ(argumentsOf(FileRecording{"a b"}), (Arguments{"file", "a b"}));
+    EXPECT_EQ(argumentsOf(StreamedRecording{"-", "pipe"}), (Arguments{"stream", "-", "pipe"}));
+    SimulationOptions options = drive("utran");
+    EXPECT_EQ(argumentsOf(options), (Arguments{"simulated", "utran", "1", "40"}));
+    options.seed = 18446744073709551615U;
+    options.packetsPerSecond = 7;
+    options.duration = std::chrono::seconds(60);
+    EXPECT_EQ(argumentsOf(options),
+              (Arguments{"simulated", "utran", "18446744073709551615", "7", "60"}));
+}
+
+TEST(Source, IsReadFromItsArguments) {
+    EXPECT_TRUE(doubles::holds([] {
+        Source source;
+        switch (doubles::any::between(0, 4)) {
+        case 0:
+            break;
+        case 1:
+            source = FileRecording{doubles::any::text()};
+            break;
+        case 2:
+            source = StreamedRecording{doubles::any::text(), doubles::any::text()};
+            break;
+        default:
+            SimulationOptions options;
+            options.technology = doubles::any::elementOf(simulatedTechnologies());
+            options.seed = doubles::any::bits();
+            options.packetsPerSecond = 1 + doubles::any::below(1'000'000);
+            if (doubles::any::boolean()) {
+                options.duration =
+                    std::chrono::seconds(doubles::any::longBetween(1, 1'000'000'000));
+            }
+            source = options;
+        }
+        const auto again = sourceOf(argumentsOf(source));
+        RC_ASSERT(again.has_value());
+        RC_ASSERT(again->index() == source.index());
+        RC_ASSERT(argumentsOf(*again) == argumentsOf(source));
+    }));
+}
+
+TEST(Source, OtherArgumentsStandForNone) {
+    for (const Arguments& arguments :
+         {Arguments{}, Arguments{"modem"}, Arguments{"service", "x"}, Arguments{"file"},
+          Arguments{"file", "a", "b"}, Arguments{"stream", "-"}, Arguments{"simulated"},
+          Arguments{"simulated", "lte", "1"}, Arguments{"simulated", "nr", "1", "40"},
+          Arguments{"simulated", "lte", "-1", "40"}, Arguments{"simulated", "lte", "1", "0"},
+          Arguments{"simulated", "lte", "1", "40", "0"},
+          Arguments{"simulated", "lte", "1", "40", "6x"},
+          Arguments{"simulated", "lte", "1", "40", "60", "1"}}) {
+        EXPECT_FALSE(sourceOf(arguments)) << testing::PrintToString(arguments);
+    }
+}
+
+} // namespace
+} // namespace pallax
