@@ -29,7 +29,7 @@ void DisplayDifference::compare(const PropertyList& display, Listener& listener)
     ++_display;
     _before.swap(_order);
     _order.clear();
-    _path = "/";
+    _path.assign(1, '/');
     visit(display, listener);
     for (auto at = _leaves.begin(); at != _leaves.end();) {
         if (at->second.display == _display) {
