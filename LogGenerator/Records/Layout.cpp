@@ -25,18 +25,16 @@ bool isRunning(std::span<const Field> fields) {
 
 } // namespace
 
-ListLayout::Sizes ListLayout::sizesIn(const LogRecord& record) const {
-    const auto others = static_cast<std::size_t>(record.read(sizeCheck->otherCount));
-    return {static_cast<std::uint8_t>(countIn(record) * entries.layout.stride),
-            static_cast<std::uint8_t>(record.length() - others * sizeCheck->otherLength)};
-}
-
-bool ListLayout::passesSizeCheck(const LogRecord& record) const {
+std::optional<ListLayout::Sizes> ListLayout::unexpectedSizes(const LogRecord& record) const {
     if (!sizeCheck) {
-        return true;
+        return std::nullopt;
     }
-    const Sizes sizes = sizesIn(record);
-    return countIn(record) != 0 && sizes.expected <= sizes.actual;
+    const std::size_t claimed = countIn(record);
+    const auto others = static_cast<std::size_t>(record.read(sizeCheck->otherCount));
+    const Sizes sizes{static_cast<std::uint8_t>(claimed * entries.layout.stride),
+                      static_cast<std::uint8_t>(record.length() - others * sizeCheck->otherLength)};
+    const bool areExpected = claimed != 0 && sizes.expected <= sizes.actual;
+    return areExpected ? std::nullopt : std::optional(sizes);
 }
 
 bool ListPart::looksFor(const PropertyList& element) const {

@@ -215,9 +215,9 @@ struct ListLayout {
         std::uint8_t expected;
         std::uint8_t actual;
     };
-    Sizes sizesIn(const LogRecord& record) const;
-    /// Whether the record claims entries and seems to have room for them; true without a check.
-    bool passesSizeCheck(const LogRecord& record) const;
+    /// Both where the list has a size check and the record claims no entries, or more than it seems
+    /// to have room for.
+    std::optional<Sizes> unexpectedSizes(const LogRecord& record) const;
 };
 
 /// Of which part of a property list the fields of a record are.

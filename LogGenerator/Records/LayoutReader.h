@@ -134,7 +134,7 @@ private:
 
     void readEntries(const ListLayout& list, const LogRecord& place, FieldId first) {
         const EntryList entries = list.entriesIn(place);
-        const std::size_t whole = list.passesSizeCheck(place) ? entries.wholeCount() : 0;
+        const std::size_t whole = list.unexpectedSizes(place) ? 0 : entries.wholeCount();
         // No optional: of its content the compiler says that it may not be initialized.
         const EntryList companions =
             list.companion ? EntryList(place, list.companion->layoutIn(place), entries.count())

@@ -58,10 +58,9 @@ bool isPlain(const CodeLayout& code) {
 
 void logUnexpectedSizes(const CodeLayout& code, const LogRecord& record) {
     for (const ListLayout& list : code.lists) {
-        if (!list.passesSizeCheck(record)) {
-            const auto [expected, actual] = list.sizesIn(record);
+        if (const auto sizes = list.unexpectedSizes(record)) {
             systemLog(LogPriority::Error, "Unexpected log packet bytes size: expected=%d actual=%d",
-                      expected, actual);
+                      sizes->expected, sizes->actual);
         }
     }
 }
