@@ -33,7 +33,8 @@ FieldInfo::Kind kindOf(const FieldDescription& field) {
     if (field.shownAs.format != nullptr) {
         return FieldInfo::Kind::Number;
     }
-    if (!field.listKey.empty()) {
+    const bool isElement = field.key.empty() && !field.position && field.formula.empty();
+    if (!field.listKey.empty() || isElement) {
         return FieldInfo::Kind::Object;
     }
     return field.position ? FieldInfo::Kind::Label : FieldInfo::Kind::Text;
@@ -75,6 +76,7 @@ public:
         : _technology(technology), _prefix(std::string(technology.technology->commandName) + ".") {}
 
     std::vector<FieldInfo> gathered() {
+        const bool isObjectStream = codesOf(_technology).empty();
         for (const SectionReference& section : _technology.sections) {
             _section = &section;
             _name = _prefix + fieldWord(section.name);
@@ -85,7 +87,11 @@ public:
             for (const std::string& key : section.objectKeys) {
                 addObjectKey(key);
             }
+            if (isObjectStream && section.objectKeys.empty()) {
+                addObjectKey(""); // the section, or an entry of it, is the value itself
+            }
         }
+        addIdentities();
         return std::move(_fields);
     }
 
@@ -114,23 +120,30 @@ private:
     }
 
     void addList(const ListDescription& list, LogCode logCode) {
-        const auto around = std::tuple(_name, _path, _isInList, _isShown);
+        const auto around = std::tuple(_name, _path, _listKey, _isInList, _isShown);
         if (!list.key.empty()) {
+            _listKey = list.key;
             _name += "." + fieldWord(list.key);
             _path += "/" + list.key;
         }
         _path += "/*";
         _isInList = true;
         _isShown = _isShown && list.isShown;
+        if (list.entryName) {
+            _identities[_path] = {std::string(kEntryName)};
+        }
         addParts(list.fields, list.lists, logCode);
-        std::tie(_name, _path, _isInList, _isShown) = around;
+        std::tie(_name, _path, _listKey, _isInList, _isShown) = around;
     }
 
     void addObjectKey(const std::string& key) {
         const std::string path = _path;
         _isInList = _section->isList;
         _path += _isInList ? "/*" : "";
-        (void)infoOf(key, FieldInfo::Kind::Text);
+        FieldInfo& info = infoOf(key, FieldInfo::Kind::Text);
+        const std::vector<std::string>& identifying = _section->identifyingKeys;
+        info.identifies =
+            std::find(identifying.begin(), identifying.end(), key) != identifying.end();
         _path = path;
         _isInList = false;
     }
@@ -150,10 +163,37 @@ private:
         info.section = _section->name;
         info.key = key;
         info.kind = kind;
-        info.meaning = _technology.meaningOf(_section->name, key);
+        info.meaning = meaningOf(key);
         info.isInList = _isInList;
         info.isShown = _isShown;
         return info;
+    }
+
+    /// A plain value means what its list does; a list without a key is the section, if that is one.
+    std::string_view meaningOf(const std::string& key) const {
+        if (key.empty() && _listKey.empty() && _isInList != _section->isList) {
+            return {};
+        }
+        return _technology.meaningOf(_section->name, key.empty() ? _listKey : key);
+    }
+
+    /// The path of the list's entries.
+    static std::string entryPathOf(const FieldInfo& field) {
+        constexpr std::string_view kAnyEntry = "/*";
+        return field.path.substr(0, field.path.rfind(kAnyEntry) + kAnyEntry.size());
+    }
+
+    void addIdentities() {
+        for (const FieldInfo& field : _fields) {
+            if (field.identifies) {
+                _identities[entryPathOf(field)].push_back(field.name);
+            }
+        }
+        for (FieldInfo& field : _fields) {
+            if (field.isInList) {
+                field.identity = _identities[entryPathOf(field)];
+            }
+        }
     }
 
     const TechnologyReference& _technology;
@@ -162,6 +202,8 @@ private:
     const SectionReference* _section = nullptr;
     std::string _name;
     std::string _path;
+    std::string _listKey; ///< of the list around that has one
+    std::map<std::string, std::vector<std::string>> _identities; ///< by the path of the entries
     bool _isInList = false;
     bool _isShown = true;
 };

@@ -13,13 +13,16 @@
 
 namespace pallax {
 
+/// Any entry of a list, in the path of a field.
+inline constexpr std::string_view kEntryName = "*";
+
 /// One field of a technology, whatever log codes tell it.
 struct FieldInfo {
     enum class Kind {
         Number, ///< with a unit, where it has one
         Label,  ///< one of `labels`, or another text
         Text,
-        Object, ///< a value of a property list, as it comes
+        Object, ///< a value or an element of a property list, as it comes
     };
 
     std::string name; ///< "lte.serving_cell_measurements.measured_rsrp": stable, as filters have it
@@ -37,6 +40,9 @@ struct FieldInfo {
     std::vector<LogCode> codes;
     bool isInList = false;
     bool identifies = false; ///< its list's entry, with the others of the list that do
+    /// The names of the fields of its list that say which cell, pilot or context an entry is;
+    /// `kEntryName` where the entry's own name in the path says it.
+    std::vector<std::string> identity;
     bool isPersonal = false;
     bool isShown = true;
     std::vector<FieldId> rows; ///< of the technology's layouts

@@ -243,10 +243,15 @@ std::string_view nameIn(const Meanings& meanings, LogCode logCode) {
 std::vector<TechnologyReference> gatherReference(const Resources& resources) {
     std::vector<TechnologyReference> technologies;
     for (const RecordedTechnology& technology : recordedTechnologies()) {
-        const Source& source = sourceOf(technology.commandName);
-        technologies.push_back({&technology, source.title, source.sections(resources)});
+        technologies.push_back(gatherReference(technology, resources));
     }
     return technologies;
+}
+
+TechnologyReference gatherReference(const RecordedTechnology& technology,
+                                    const Resources& resources) {
+    const Source& source = sourceOf(technology.commandName);
+    return {&technology, source.title, source.sections(resources)};
 }
 
 Meanings meaningsOf(const TechnologyReference& technology) {

@@ -22,6 +22,7 @@ struct SectionReference {
     std::vector<CodeDescription> codes = {};
     /// IFX: the keys, which have no log code.
     std::vector<std::string> objectKeys = {};
+    std::vector<std::string> identifyingKeys = {}; ///< of those: which cell an entry is
     /// Of the section: a sentence, where its layout holds one.
     std::string_view meaning = {};
 };
@@ -40,6 +41,9 @@ struct TechnologyReference {
 /// The descriptions of all technologies, by link type; the sections are in the order of the
 /// templates in `resources`.
 std::vector<TechnologyReference> gatherReference(const Resources& resources);
+/// The same of one technology, which needs only its own template.
+TechnologyReference gatherReference(const RecordedTechnology& technology,
+                                    const Resources& resources);
 
 /// The sentences of a technology that stand in no layout, without those that several have in
 /// common.

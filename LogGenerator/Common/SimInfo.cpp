@@ -27,7 +27,9 @@ constexpr auto kSimFiles = std::to_array<Field>({
     simFile("kSimFile_PSLOCI", "EF-GPRS/PS-LOCI",
             "Temporary identity, routing area and update status of the packet-switched domain.")
         .personal(),
-    simFile("kSimFile_ACC", "EF-ACCESS CONTROL CLASS", "Access control classes of the subscriber."),
+    // One of classes 0 to 9 follows from the IMSI; 11 to 15 are for users with special duties.
+    simFile("kSimFile_ACC", "EF-ACCESS CONTROL CLASS", "Access control classes of the subscriber.")
+        .personal(),
     simFile("kSimFile_AD", "EF-ADMINISTRATIVE DATA",
             "Mode of operation of the card, and the length of the network code in its IMSI."),
     simFile("kSimFile_FPLMN", "EF-FPLMN", "Forbidden networks."),

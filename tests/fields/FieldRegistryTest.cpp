@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <map>
 #include <set>
 #include <string>
 
@@ -23,6 +24,27 @@ FieldRegistry registryOf(std::string_view commandName) {
         }
     }
     throw std::invalid_argument("no such technology");
+}
+
+/// The last words of the names in each list's identity, by the path of its entries.
+using Identities = std::map<std::string, std::vector<std::string>>;
+
+Identities identitiesIn(std::string_view commandName) {
+    Identities identities;
+    const FieldRegistry registry = registryOf(commandName);
+    for (const FieldInfo& field : registry.fields()) {
+        if (!field.isInList) {
+            continue;
+        }
+        std::vector<std::string> words;
+        for (const std::string& name : field.identity) {
+            words.push_back(name.substr(name.rfind('.') + 1));
+        }
+        const std::string entries = field.path.substr(0, field.path.rfind('*') + 1);
+        const auto [place, isNew] = identities.emplace(entries, words);
+        EXPECT_EQ(place->second, words) << field.name;
+    }
+    return identities;
 }
 
 TEST(FieldRegistry, KnowsAFieldOfASection) {
@@ -54,7 +76,114 @@ TEST(FieldRegistry, KnowsWhichCellAnEntryIs) {
     EXPECT_EQ(field->path, "/Neighbor Cells List/*/Physical Cell ID");
     EXPECT_TRUE(field->isInList);
     EXPECT_TRUE(field->identifies);
-    EXPECT_FALSE(registry.named("lte.neighbor_cells_list.srxlev")->identifies);
+    const FieldInfo* level = registry.named("lte.neighbor_cells_list.srxlev");
+    ASSERT_NE(level, nullptr);
+    EXPECT_FALSE(level->identifies);
+    EXPECT_EQ(level->identity,
+              std::vector<std::string>{"lte.neighbor_cells_list.physical_cell_id"});
+    EXPECT_EQ(registry.named("lte.serving_cell_info.physical_cell_id")->identity,
+              std::vector<std::string>());
+}
+
+TEST(FieldRegistry, KnowsTheIdentityOfEveryList) {
+    EXPECT_EQ(identitiesIn("ifx"), (Identities{
+                                       {"/Barred Cells/*", {"barred_cells"}},
+                                       {"/Neighbour Cells/*", {"arfcn", "bsic"}},
+                                   }));
+    EXPECT_EQ(identitiesIn("gsm"),
+              (Identities{
+                  {"/Active Set/*", {"scrambling_code"}},
+                  {"/BLER/Transport Channels/*", {"transport_channel_id"}},
+                  {"/Equivalent PLMN List/*", {"mobile_country_code", "mobile_network_code"}},
+                  {"/GSM Set/*", {"arfcn", "bsic"}},
+                  {"/HSDPA Info/Primary HARQ Process/*", {"process_id"}},
+                  {"/HSDPA Info/Secondary HARQ Process/*", {"process_id"}},
+                  {"/Mobile Allocation/ARFCNs/*", {"arfcns"}},
+                  {"/Neighboring Cells/*", {"arfcn", "bsic"}},
+                  {"/PDP Context Info/*", {}},
+                  {"/UMTS RR Info/*", {}},
+                  {"/UMTS Set/*", {"scrambling_code", "downlink_frequency", "uarfcn"}},
+              }));
+    EXPECT_EQ(identitiesIn("cdma"), (Identities{
+                                        {"/1x/Active Set/*", {"*"}},
+                                        {"/EV-DO/Active Set/*", {"*"}},
+                                        {"/EV-DO/Finger C2I/*", {"*"}},
+                                    }));
+    EXPECT_EQ(identitiesIn("lte"), (Identities{
+                                       {"/Detected Cells/*", {"physical_cell_id"}},
+                                       {"/Measured Neighbor Cells/*", {"physical_cell_id"}},
+                                       {"/Neighbor Cells List/*", {"physical_cell_id"}},
+                                       {"/PDP Context Info/*", {}},
+                                       {"/Reselection Candidates List/*",
+                                        {"candidate_rat_type", "e_arfcn", "cell_id", "u_arfcn",
+                                         "psc", "arfcn", "band", "bsic_id", "channel", "pilot"}},
+                                   }));
+    EXPECT_EQ(identitiesIn("utran"),
+              (Identities{
+                  {"/CCTRCH SIR/*", {"cctrch_id"}},
+                  {"/CCTRCH SIR/*/SIR/*", {}},
+                  {"/GSM Neighbor Cell List/*", {"band_indicator", "ncc", "bcc", "arfcn"}},
+                  {"/Neighbor Cell List/*", {"uarfcn", "cell_id"}},
+                  {"/PDP Context Info/*", {}},
+                  {"/TRCH BLER/*", {"trch_id"}},
+              }));
+}
+
+TEST(FieldRegistry, KnowsWhatIdentifiesAPerson) {
+    std::set<std::string> personal;
+    for (const TechnologyReference& technology : technologies()) {
+        const FieldRegistry registry(technology);
+        for (const FieldInfo& field : registry.fields()) {
+            if (field.isPersonal) {
+                personal.insert(field.name);
+            }
+        }
+    }
+    EXPECT_EQ(personal, (std::set<std::string>{
+                            "cdma.ev_do.uati24",
+                            "gsm.pdp_context_info",
+                            "gsm.sim_info.ef_3gpp_mail_box_dialing_number",
+                            "gsm.sim_info.ef_access_control_class",
+                            "gsm.sim_info.ef_gprs_ps_loci",
+                            "gsm.sim_info.ef_iccid",
+                            "gsm.sim_info.ef_loci",
+                            "gsm.sim_info.ef_msisdn",
+                            "lte.pdp_context_info",
+                            "lte.sim_info.ef_3gpp_mail_box_dialing_number",
+                            "lte.sim_info.ef_access_control_class",
+                            "lte.sim_info.ef_gprs_ps_loci",
+                            "lte.sim_info.ef_iccid",
+                            "lte.sim_info.ef_loci",
+                            "lte.sim_info.ef_msisdn",
+                            "utran.pdp_context_info",
+                            "utran.sim_info.ef_3gpp_mail_box_dialing_number",
+                            "utran.sim_info.ef_access_control_class",
+                            "utran.sim_info.ef_gprs_ps_loci",
+                            "utran.sim_info.ef_iccid",
+                            "utran.sim_info.ef_loci",
+                            "utran.sim_info.ef_msisdn",
+                        }));
+}
+
+TEST(FieldRegistry, APlainValueMeansWhatItsListDoes) {
+    EXPECT_EQ(registryOf("gsm").named("gsm.mobile_allocation.arfcns")->meaning,
+              "ARFCNs that the channel hops over.");
+    EXPECT_EQ(registryOf("cdma").named("cdma.1x.active_set")->meaning,
+              "Pilots of the active set by their PN offset, each with its Ec/Io.");
+    EXPECT_EQ(registryOf("utran").named("utran.cctrch_sir.sir")->meaning,
+              "Six signal-to-interference ratios, as the modem counts them.");
+    EXPECT_EQ(registryOf("gsm").named("gsm.umts_rr_info")->meaning, "") << "no shown list";
+}
+
+TEST(FieldRegistry, AnElementOfAPropertyListIsAnObject) {
+    const FieldRegistry registry = registryOf("lte");
+    const FieldInfo* context = registry.named("lte.pdp_context_info");
+    ASSERT_NE(context, nullptr);
+    EXPECT_EQ(context->kind, FieldInfo::Kind::Object);
+    EXPECT_EQ(context->path, "/PDP Context Info/*");
+    EXPECT_EQ(context->meaning,
+              "The packet data contexts, each as the telephony service describes it.");
+    EXPECT_EQ(registry.named("lte.sim_info.ef_iccid")->kind, FieldInfo::Kind::Object);
 }
 
 TEST(FieldRegistry, AFieldOfTwoLogCodesIsOne) {
@@ -82,6 +211,11 @@ TEST(FieldRegistry, NamesTheKnownKeysOfAnObjectStream) {
     ASSERT_NE(registry.named("ifx.serving_cell.arfcn"), nullptr);
     EXPECT_EQ(registry.named("ifx.serving_cell.arfcn")->path, "/Serving Cell/ARFCN");
     EXPECT_EQ(registry.named("ifx.neighbour_cells.bsic")->path, "/Neighbour Cells/*/BSIC");
+    ASSERT_NE(registry.named("ifx.rr"), nullptr) << "a section that is the value itself";
+    EXPECT_EQ(registry.named("ifx.rr")->path, "/RR");
+    EXPECT_EQ(registry.named("ifx.rr")->meaning, "State of the radio resource layer.");
+    ASSERT_NE(registry.named("ifx.barred_cells"), nullptr);
+    EXPECT_EQ(registry.named("ifx.barred_cells")->path, "/Barred Cells/*");
 }
 
 TEST(FieldRegistry, UnknownNamesAndRowsHaveNoField) {
