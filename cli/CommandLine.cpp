@@ -89,6 +89,7 @@ CommandLine::CommandLine()
     addView(demo, _demo);
     addSimulate(addCommand("simulate", "Write a simulated modem's packets to a recording"),
                 _simulate);
+    addFields(addCommand("fields", "List every field of the display"), _fields);
     addTexts();
 }
 
@@ -186,6 +187,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("simulate")) {
         return _simulate;
+    }
+    if (_app->got_subcommand("fields")) {
+        return _fields;
     }
     return _browse;
 }

@@ -23,6 +23,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax decode --every tick --format csv drive.pcap > drive.csv
   pallax record drive.pcapng           record the live modem
   pallax service --play drive.pcap     play a recording to viewers
+  pallax fields | grep -i rsrp         look up a field
 
 Each command has its own help (pallax decode --help). To open a recording with
 the name of a command, add its folder (pallax ./decode).
@@ -51,6 +52,27 @@ Exit status:
   1   failure: cannot read a recording or template, or write the output
   2   wrong usage
   70  with --strict: ended by a fatal record)";
+
+constexpr const char* kFieldsFooter = R"(Examples:
+  pallax fields lte
+  pallax fields | grep -i rsrp
+  pallax fields --json | jq -r 'select(.personal).name'
+
+A line has the field's name, unit, kind, range and marks ("-" if there is none),
+then its meaning, its path in the display, and its labels separated by "|". In a
+path, "*" is any entry of a list. A number can have a unit and a range, a label
+is one of a few texts, and an object is a value of any type.
+
+The mark "identity" is on the fields that together tell which cell, pilot or
+context a list entry is, "personal" on those that identify a person, a device or
+a subscription, and "hidden" on those that are read but not shown. In JSON,
+"identity" names the identity fields of the field's list; "*" there is the
+entry's name in the path.
+
+Exit status:
+  0   success, or the reader of the output has gone
+  1   failure: cannot read a template, or write the output
+  2   wrong usage)";
 
 constexpr const char* kRecordFooter = R"(Examples:
   pallax record drive.pcapng
@@ -105,13 +127,13 @@ void addView(CLI::App& app, BrowseOptions& options) {
 
 namespace {
 
-void addTechnology(CLI::App& app, const RecordedTechnology*& technology,
+void addTechnology(CLI::App& app, const std::string& name, const RecordedTechnology*& technology,
                    const std::string& description) {
     std::vector<std::pair<std::string, const RecordedTechnology*>> technologies;
     for (const RecordedTechnology& each : recordedTechnologies()) {
         technologies.emplace_back(each.commandName, &each);
     }
-    addChoice(app, "--technology", technology, technologies, description);
+    addChoice(app, name, technology, technologies, description);
 }
 
 } // namespace
@@ -130,7 +152,7 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
 }
 
 void addDecode(CLI::App& app, DecodeOptions& options) {
-    addTechnology(app, options.technology,
+    addTechnology(app, "--technology", options.technology,
                   "The technology of the recordings (default: from their link type)");
     addChoice<std::optional<Every>>(
         app, "--every", options.every,
@@ -157,12 +179,19 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
     app.footer(kDecodeFooter);
 }
 
+void addFields(CLI::App& app, FieldsOptions& options) {
+    app.add_flag("--json", options.json, "JSON, one object per line");
+    addTechnology(app, "TECHNOLOGY", options.technology, "Technology of the fields (default: all)");
+    app.footer(kFieldsFooter);
+}
+
 void addRecord(CLI::App& app, RecordOptions& options) {
     app.add_option("FILE", options.files.path,
                    "The recording to write (pcapng; - is standard output)")
         ->required()
         ->type_name("");
-    addTechnology(app, options.technology, "Refuse a modem that speaks another technology");
+    addTechnology(app, "--technology", options.technology,
+                  "Refuse a modem that speaks another technology");
     const auto takeSize = [&options](const std::string& text) {
         const auto size = parseSize(text);
         if (!size) {

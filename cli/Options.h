@@ -3,6 +3,7 @@
 #include "browsing/BrowseOptions.h"
 #include "console/ExitStatus.h"
 #include "decoding/DecodeCommand.h"
+#include "decoding/FieldsCommand.h"
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
 #include "telephony/Service.h"
@@ -27,11 +28,12 @@ struct ParseEnd {
 struct ServiceStatusOptions {};
 
 using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions,
-                                   ServiceStatusOptions, SimulateOptions, ParseEnd>;
+                                   ServiceStatusOptions, SimulateOptions, FieldsOptions, ParseEnd>;
 
-/// The options for browsing, decoding and recording, which must outlive the app.
+/// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);
 void addDecode(CLI::App& app, DecodeOptions& options);
+void addFields(CLI::App& app, FieldsOptions& options);
 void addRecord(CLI::App& app, RecordOptions& options);
 /// The options of all ways of browsing.
 void addView(CLI::App& app, BrowseOptions& options);

@@ -29,6 +29,7 @@ struct Run {
         return printServiceStatus() == 0 ? kExitSuccess : kExitFailure;
     }
     ExitStatus operator()(const SimulateOptions& options) const { return runSimulate(options); }
+    ExitStatus operator()(const FieldsOptions& options) const { return runFields(options); }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);

@@ -68,7 +68,7 @@ private:
 TEST_F(EndToEndClosedPipe, EndsHelpAndVersion) {
     endsQuietly({"--help"});
     endsQuietly({"--version"});
-    for (const char* command : {"decode", "record", "service", "demo", "simulate"}) {
+    for (const char* command : {"decode", "record", "service", "demo", "simulate", "fields"}) {
         endsQuietly({command, "--help"});
     }
 }
@@ -78,6 +78,14 @@ TEST_F(EndToEndClosedPipe, EndsTheTextsForPackages) {
         endsQuietly({"completion", shell});
     }
     endsQuietly({"manual", "pallax-decode"});
+}
+
+TEST_F(EndToEndClosedPipe, EndsFields) {
+    for (const std::vector<std::string>& arguments :
+         {std::vector<std::string>{"fields"}, std::vector<std::string>{"fields", "--json"}}) {
+        endsQuietly(arguments);
+        endsQuietlyAfterTheBeginning(arguments);
+    }
 }
 
 TEST_F(EndToEndClosedPipe, EndsDecode) {

@@ -61,6 +61,21 @@ TEST_F(EndToEndEscaping, DecodedDataCommandsNoTerminal) {
     EXPECT_EQ(several, json + json) << "as one after the other";
 }
 
+TEST_F(EndToEndEscaping, NoSectionOfATemplateCommandsTheTerminalThatListsItsFields) {
+    const std::string section = std::string("Owned") + kHostile;
+    std::ofstream(world.path("C2KTemplate.plist"))
+        << doubles::textForm(Dictionary{{section.c_str(), Dictionary{{"Channel", "kChannel"}}}});
+    world.environment = {"PALLAX_RESOURCES=" + world.path()};
+    const std::string text = onTerminal({"fields", "cdma"}, 0);
+    EXPECT_EQ(commandIn(text), "") << text;
+    EXPECT_NE(text.find(std::string("/Owned") + kEscaped + "/Channel"), std::string::npos) << text;
+    const std::string json = onTerminal({"fields", "--json", "cdma"}, 0);
+    EXPECT_EQ(commandIn(json), "") << json;
+    EXPECT_NE(json.find("/Owned\\u001b]0;owned"), std::string::npos) << json;
+    EXPECT_NE(run({"fields", "cdma"}).out.find("/" + section + "/Channel"), std::string::npos)
+        << "a pipe gets it unchanged";
+}
+
 TEST_F(EndToEndEscaping, APipeGetsCsvAsTheModemSentItAndJsonWithoutControlCharacters) {
     const std::string recording = hostile("a.pcap");
     const Run csv = run({"decode", "--format", "csv", recording});
@@ -93,6 +108,9 @@ TEST_F(EndToEndEscaping, NoFileNameSettingOrOptionInASentenceCommandsTheTerminal
     const std::string option = onTerminal({"decode", lteDrive(), "--format", kHostile}, 2);
     EXPECT_EQ(commandIn(option), "") << option;
     EXPECT_NE(option.find(kEscaped), std::string::npos) << option;
+    const std::string technology = onTerminal({"fields", kHostile}, 2);
+    EXPECT_EQ(commandIn(technology), "") << technology;
+    EXPECT_NE(technology.find(kEscaped), std::string::npos) << technology;
 
     std::ofstream(world.path("config/pallax/pallax.conf"))
         << "on-fatal-record = " << kHostile << "\n";

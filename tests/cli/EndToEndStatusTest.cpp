@@ -164,6 +164,20 @@ TEST_F(EndToEndStatus, OfSimulate) {
     expectEveryDocumentedStatus({"simulate"});
 }
 
+TEST_F(EndToEndStatus, OfFields) {
+    ends({{"fields", "--json"}, 0, ""});
+    ends({{"fields"},
+          1,
+          "pallax: Standard output cannot be written: No space left on device.\n",
+          "/dev/null",
+          "/dev/full"});
+    ends({{"fields", "umts"},
+          2,
+          "pallax: TECHNOLOGY: \"umts\" is not one of ifx|gsm|cdma|lte|utran "
+          "(see pallax fields --help)\n"});
+    expectEveryDocumentedStatus({"fields"});
+}
+
 TEST_F(EndToEndStatus, OfTheTextsForPackages) {
     const std::string full =
         "pallax: Standard output cannot be written: No space left on device.\n";

@@ -222,9 +222,20 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
               "service --help)\n");
 }
 
+TEST(Options, FieldsAreOfEveryTechnologyUnlessOneIsNamed) {
+    const auto plain = parsed<FieldsOptions>({"fields"});
+    EXPECT_EQ(plain.technology, nullptr);
+    EXPECT_FALSE(plain.json);
+    const auto told = parsed<FieldsOptions>({"fields", "cdma", "--json"});
+    ASSERT_NE(told.technology, nullptr);
+    EXPECT_EQ(told.technology->commandName, "cdma");
+    EXPECT_TRUE(told.json);
+    EXPECT_EQ(ended({"fields", "lte", "gsm"}).status, kExitWrongUsage);
+}
+
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
-    for (const char* command :
-         {"", "decode", "record", "service", "demo", "simulate", "completion", "manual"}) {
+    for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "fields",
+                                "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);

@@ -64,7 +64,7 @@ const std::vector<Layer>& layers() {
         {"console", {"text", "platform", "host"}},
         {"decoding",
          {"text", "plist", "platform", "timeline", records, generators, "LogGenerator/Technologies",
-          "app/tree", "monitor", "host", "console"}},
+          "app/tree", "monitor", "host", "fields", "console"}},
         {"link",
          {"text", "platform", "LogGenerator/Technologies", "monitor", "host", "telephony",
           "console", "decoding"}},

@@ -47,6 +47,7 @@ protected:
 
 TEST_F(Completion, BashOffersCommands) {
     EXPECT_EQ(inBash("pallax de", 1), "decode\ndemo\n");
+    EXPECT_EQ(inBash("pallax f", 1), "fields\n");
     folder.write("seven.pcap", "");
     EXPECT_EQ(inBash("pallax s", 1), "service\nsimulate\nseven.pcap\n") << "and files";
 }
@@ -65,6 +66,7 @@ TEST_F(Completion, BashOffersTheChoicesOfAnOption) {
     EXPECT_EQ(inBash("pallax --speed ''", 2), "max\n");
     EXPECT_EQ(inBash("pallax --log-level ''", 2), "0\n1\n2\n3\n4\n5\n6\n7\n");
     EXPECT_EQ(inBash("pallax demo ''", 2), "ifx\ngsm\ncdma\nlte\nutran\n");
+    EXPECT_EQ(inBash("pallax fields c", 2), "cdma\n");
     EXPECT_EQ(inBash("pallax demo --seed ''", 3), "") << "a number is the user's";
 }
 
@@ -79,10 +81,10 @@ TEST_F(Completion, BashOffersFilesWhereARecordingOrFileIsTaken) {
 
 TEST_F(Completion, EveryOptionIsInEveryScript) {
     const CommandDescription program = CommandLine().description();
-    ASSERT_EQ(program.commands.size(), 5U);
+    ASSERT_EQ(program.commands.size(), 6U);
     const std::string fish = script("fish");
     for (const CommandDescription& command : program.commands) {
-        ASSERT_GT(command.options.size(), 3U);
+        ASSERT_GE(command.options.size(), 3U);
         for (const OptionDescription& option : command.options) {
             for (const std::string& name : option.names) {
                 const bool isLong = name.starts_with("--");
@@ -117,6 +119,7 @@ TEST_F(Completion, FishOffersCommandsOptionsChoicesAndFiles) {
     EXPECT_EQ(inFish("pallax decode --ev"),
               "--every\tWhen to write the display (default: end; for csv, tick)\n");
     EXPECT_EQ(inFish("pallax simulate cd"), "cdma\n");
+    EXPECT_EQ(inFish("pallax fields --j"), "--json\tJSON, one object per line\n");
     EXPECT_EQ(inFish("pallax --color n"),
               "never\tColour on the screen (default: auto; never if NO_COLOR is set)\n");
     EXPECT_EQ(inFish("pallax decode dr"), "drive.pcap\n");

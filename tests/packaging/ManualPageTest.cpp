@@ -29,9 +29,10 @@ CommandDescription program() {
 }
 
 TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
-    EXPECT_EQ(manualPages(program()),
-              (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record",
-                                        "pallax-service", "pallax-demo", "pallax-simulate"}));
+    EXPECT_EQ(
+        manualPages(program()),
+        (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record", "pallax-service",
+                                  "pallax-demo", "pallax-simulate", "pallax-fields"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 
@@ -41,7 +42,7 @@ TEST(ManualPage, EveryOptionIsOnItsPageWithItsValueAndDescription) {
     for (const CommandDescription& command : all) {
         const std::string name = command.name == "pallax" ? "pallax" : "pallax-" + command.name;
         const std::string page = plain(manualPage(program(), name));
-        ASSERT_GT(command.options.size(), 3U);
+        ASSERT_GE(command.options.size(), 3U);
         for (const OptionDescription& option : command.options) {
             std::string names;
             for (const std::string& each : option.names) {
