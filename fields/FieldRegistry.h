@@ -43,7 +43,7 @@ struct FieldInfo {
     /// The names of the fields of its list that say which cell, pilot or context an entry is;
     /// `kEntryName` where the entry's own name in the path says it.
     std::vector<std::string> identity;
-    bool isPersonal = false;
+    bool isPersonal = false; ///< identifies a person, a device or a subscription
     bool isShown = true;
     std::vector<FieldId> rows; ///< of the technology's layouts
 };
