@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -113,6 +114,67 @@ TEST(Dictionary, AValueToSetIsTheOneThereOrANewOne) {
     dictionary.valueToSet("A").assign(Text("4"));
     EXPECT_TRUE(dictionary.valueToSet("C").isNull());
     EXPECT_TRUE(sameInOrder(dictionary, Dictionary{{"A", "4"}, {"B", "3"}, {"C", PropertyList()}}));
+}
+
+/// Fills a dictionary again from its start.
+void refill(Dictionary& dictionary, const std::vector<std::string_view>& keys) {
+    dictionary.startOver();
+    for (const std::string_view key : keys) {
+        dictionary.valueInOrder(key).assign(Text(key));
+    }
+}
+
+TEST(Dictionary, FilledAgainInOrderItKeepsWhatHasNotBeenReached) {
+    Dictionary dictionary{{"A", "1"}, {"B", "2"}, {"C", "3"}};
+    refill(dictionary, {"A", "B"});
+    EXPECT_TRUE(sameInOrder(dictionary, Dictionary{{"A", "A"}, {"B", "B"}, {"C", "3"}}));
+    dictionary.dropRest();
+    EXPECT_TRUE(sameInOrder(dictionary, Dictionary{{"A", "A"}, {"B", "B"}}));
+    refill(dictionary, {"A", "B", "D"});
+    EXPECT_TRUE(sameInOrder(dictionary, Dictionary{{"A", "A"}, {"B", "B"}, {"D", "D"}}));
+}
+
+TEST(Dictionary, AKeyOutOfOrderRemovesAllThatFollow) {
+    Dictionary dictionary{{"A", "1"}, {"B", "2"}, {"C", "3"}, {"D", "4"}};
+    refill(dictionary, {"A", "C"});
+    EXPECT_TRUE(sameInOrder(dictionary, Dictionary{{"A", "A"}, {"C", "C"}}))
+        << "C was there, but not next";
+    EXPECT_EQ(dictionary.find("B"), nullptr);
+    EXPECT_EQ(dictionary.find("D"), nullptr);
+    EXPECT_TRUE(dictionary.valueInOrder("B").isNull()) << "a new one";
+    refill(dictionary, {"C"});
+    EXPECT_TRUE(sameInOrder(dictionary, Dictionary{{"C", "C"}}));
+}
+
+TEST(Dictionary, StartedOverAndNotFilledItHasNothingButTheRest) {
+    Dictionary dictionary{{"A", "1"}, {"B", "2"}};
+    dictionary.startOver();
+    dictionary.dropRest();
+    EXPECT_TRUE(dictionary.empty());
+    refill(dictionary, {"B"});
+    EXPECT_TRUE(sameInOrder(dictionary, Dictionary{{"B", "B"}}));
+}
+
+TEST(Dictionary, ALargeOneThatIsFilledAgainFindsExactlyItsKeys) {
+    static const std::vector<std::string> kNames = [] {
+        std::vector<std::string> names;
+        for (int index = 0; index < 100; ++index) {
+            names.push_back(std::to_string(index));
+        }
+        return names;
+    }();
+    Dictionary dictionary;
+    refill(dictionary, {kNames.begin(), kNames.end()});
+    ASSERT_EQ(dictionary.size(), 100U);
+    refill(dictionary, {kNames.begin(), kNames.begin() + 40});
+    dictionary.dropRest();
+    EXPECT_EQ(dictionary.size(), 40U);
+    EXPECT_EQ(*dictionary.find("39"), PropertyList("39"));
+    EXPECT_EQ(dictionary.find("40"), nullptr);
+    refill(dictionary, {kNames.begin() + 1, kNames.end()});
+    EXPECT_EQ(dictionary.size(), 99U);
+    EXPECT_EQ(dictionary.find("0"), nullptr);
+    EXPECT_EQ(*dictionary.find("99"), PropertyList("99"));
 }
 
 } // namespace

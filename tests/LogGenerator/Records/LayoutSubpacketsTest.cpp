@@ -1,4 +1,5 @@
 #include "LogGenerator/Records/LayoutReader.h"
+#include "tests/LogGenerator/Records/SampleLines.h"
 #include "tests/doubles/SubpacketBuilder.h"
 
 #include <gtest/gtest.h>
@@ -12,6 +13,8 @@ namespace {
 
 using doubles::packetOf;
 using doubles::Subpacket;
+
+using Texts = std::vector<std::string>;
 
 constexpr Condition kIsOn{u8At(4), 1, 1, "off", 1};
 constexpr auto kSwitchFields = std::to_array<Field>({{"Switch", u8At(4), Conversion::number()}});
@@ -39,49 +42,29 @@ constexpr auto kSubpackets = std::to_array<SubpacketLayout>({
 });
 constexpr CodeLayout kCode{.logCode = 0x119C, .subpackets = kSubpackets};
 
-/// "ID KEY VALUE" for each sample.
-class Samples final : public SampleSink {
-public:
-    void sample(const Sample& sample) override {
-        PropertyList value;
-        sample.value.showIn(value);
-        lines.push_back(std::to_string(sample.id) + " " + std::string(sample.field.key) + " " +
-                        value.string().value_or("(no text)"));
-    }
-    void keyRemoved(std::string_view /*key*/) override {}
-    void beginList(const SampleList& /*list*/) override {}
-    void endList() override {}
-    void beginEntry(std::size_t /*index*/, std::int64_t /*name*/) override {}
-    void endEntry() override {}
-
-    std::vector<std::string> lines;
-};
-
-std::vector<std::string> samplesOf(const std::vector<Subpacket>& subpackets) {
-    const ByteBuffer bytes = packetOf(0x119C, subpackets).bytes();
-    Samples samples;
-    RecordMemory memory;
-    LayoutReader(samples, memory, 10).read(kCode, LogRecord(bytes));
-    return samples.lines;
+Texts subpacketSamples(const std::vector<Subpacket>& subpackets) {
+    return samplesOf(kCode, packetOf(0x119C, subpackets).bytes());
 }
 
 TEST(LayoutSubpackets, AreReadInTheOrderOfTheLayout) {
-    EXPECT_EQ(
-        samplesOf({Subpacket(2).u8(7).u8(8), Subpacket(3).u8(3).u8(4).u8(5), Subpacket(1).u8(1)}),
-        (std::vector<std::string>{"10 Switch 1", "11 Power 7", "12 Gain 8", "13  12", "13  15"}));
+    EXPECT_EQ(subpacketSamples(
+                  {Subpacket(2).u8(7).u8(8), Subpacket(3).u8(3).u8(4).u8(5), Subpacket(1).u8(1)}),
+              (Texts{"10 Switch 1 raw 1", "11 Power 7 raw 7", "12 Gain 8 raw 8", "[Products 2",
+                     "{0 0", "13  12", "}", "{1 0", "13  15", "}", "]"}));
 }
 
 TEST(LayoutSubpackets, AConditionMayStandInAnother) {
-    EXPECT_EQ(samplesOf({Subpacket(2).u8(7).u8(8), Subpacket(1).u8(2)}),
-              (std::vector<std::string>{"10 Switch 2", "11 Power 7", "12 Gain off"}));
-    EXPECT_EQ(samplesOf({Subpacket(2).u8(1).u8(8)}),
-              (std::vector<std::string>{"11 Power 1", "12 Gain off"}))
+    EXPECT_EQ(subpacketSamples({Subpacket(2).u8(7).u8(8), Subpacket(1).u8(2)}),
+              (Texts{"10 Switch 2 raw 2", "11 Power 7 raw 7", "12 Gain off"}));
+    EXPECT_EQ(subpacketSamples({Subpacket(2).u8(1).u8(8)}),
+              (Texts{"11 Power 1 raw 1", "12 Gain off"}))
         << "which is not there";
 }
 
 TEST(LayoutSubpackets, OneThatIsNotThereKeepsItsRows) {
-    EXPECT_EQ(samplesOf({Subpacket(1).u8(1), Subpacket(3).u8(2).u8(3).u8(4)}),
-              (std::vector<std::string>{"10 Switch 1", "13  6", "13  8"}));
+    EXPECT_EQ(subpacketSamples({Subpacket(1).u8(1), Subpacket(3).u8(2).u8(3).u8(4)}),
+              (Texts{"10 Switch 1 raw 1", "[Products 2", "{0 0", "13  6", "}", "{1 0", "13  8", "}",
+                     "]"}));
 }
 
 } // namespace

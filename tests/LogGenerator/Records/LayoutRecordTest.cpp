@@ -1,0 +1,231 @@
+#include "LogGenerator/Records/LayoutRecord.h"
+
+#include "tests/LogGenerator/Records/SampleLines.h"
+#include "tests/doubles/RecordFixture.h"
+
+#include <gtest/gtest.h>
+
+#include <array>
+
+namespace pallax {
+namespace {
+
+using doubles::RecordingLog;
+using Lines = std::vector<RecordingLog::Line>;
+
+constexpr auto kSpeedFields = std::to_array<Field>({{"Speed", u8At(0), Conversion::number()}});
+constexpr auto kHeightFields = std::to_array<Field>({{"Height", u8At(0), Conversion::number()}});
+
+constexpr auto kTwoCodes = std::to_array<CodeLayout>({
+    {.logCode = 100, .minimumLength = 1, .fields = kSpeedFields},
+    {.logCode = 200, .minimumLength = 2, .fields = kHeightFields},
+});
+constexpr RecordLayout kReports{.section = "Flight", .logLine = "A flight", .codes = kTwoCodes};
+constexpr RecordLayout kSilent{.section = "Flight",
+                               .logLine = "A flight",
+                               .codes = kTwoCodes,
+                               .priority = LogPriority::Error,
+                               .reportsOtherCodes = false};
+constexpr RecordLayout kReadsAll{
+    .section = "Flight", .logLine = "A flight", .codes = kTwoCodes, .readsOtherCodes = true};
+
+/// A record with its section, in a class index or as if.
+class LayoutFixture {
+public:
+    explicit LayoutFixture(const RecordLayout& layout) : record(layout) {
+        section =
+            layout.kind == SectionKind::List ? PropertyList(Array()) : PropertyList(Dictionary());
+        record.updateSectionRef(section);
+    }
+    Lines feed(const ByteBuffer& bytes, LogCode logCode) {
+        RecordingLog log;
+        record.updateWithData(LogRecord(bytes), logCode);
+        return log.take();
+    }
+
+    LayoutRecord record;
+    PropertyList section;
+};
+
+TEST(LayoutRecord, ReadsEachCodeByItsLayout) {
+    LayoutFixture fixture(kReports);
+    EXPECT_EQ(fixture.record.getSectionName(), "Flight");
+    EXPECT_EQ(std::vector<LogCode>(fixture.record.getLogCodeArray().begin(),
+                                   fixture.record.getLogCodeArray().end()),
+              (std::vector<LogCode>{100, 200}));
+    EXPECT_EQ(fixture.feed({7}, 100), (Lines{{4, "A flight"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "7"}}));
+    EXPECT_EQ(fixture.feed({8}, 200), (Lines{{4, "A flight"}})) << "too short, without a word";
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "7"}}));
+    EXPECT_EQ(fixture.feed({8, 0}, 200), (Lines{{4, "A flight"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "7"}, {"Height", "8"}}));
+}
+
+TEST(LayoutRecord, AnUnknownCodeIsLoggedOrNot) {
+    LayoutFixture reports(kReports);
+    EXPECT_EQ(reports.feed({7, 7}, 300),
+              (Lines{{4, "A flight"}, {3, "Received an unknown log message: 300"}}));
+    EXPECT_EQ(reports.section, PropertyList(Dictionary()));
+    LayoutFixture silent(kSilent);
+    EXPECT_EQ(silent.feed({7, 7}, 300), (Lines{{3, "A flight"}})) << "at the layout's priority";
+    EXPECT_EQ(silent.section, PropertyList(Dictionary()));
+}
+
+TEST(LayoutRecord, OtherCodesMayBeReadAsTheFirst) {
+    LayoutFixture fixture(kReadsAll);
+    EXPECT_EQ(fixture.feed({7, 7}, 300), (Lines{{4, "A flight"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "7"}}));
+    (void)fixture.feed({8, 0}, 200);
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "7"}, {"Height", "8"}}));
+}
+
+bool acceptsFives(const CodeLayout& code, const LogRecord& record) {
+    if (record.u8(0) != 5) {
+        systemLog(LogPriority::Error, "%d of code %d", record.u8(0), code.logCode);
+    }
+    return record.u8(0) == 5;
+}
+void logsLength(const CodeLayout& code, const LogRecord& record) {
+    systemLog(LogPriority::Informational, "%d bytes of code %d", record.length(), code.logCode);
+}
+void logsShown(const LogRecord& record, const PropertyList& section) {
+    systemLog(LogPriority::Informational, "%d: %s", record.u8(0), section.description());
+}
+constexpr auto kHookedCodes = std::to_array<CodeLayout>({
+    {.logCode = 100,
+     .minimumLength = 9,
+     .fields = kSpeedFields,
+     .accepts = acceptsFives,
+     .logs = logsLength},
+    {.logCode = 200, .fields = kHeightFields, .logsSection = logsShown},
+});
+constexpr RecordLayout kHooked{.section = "Flight", .logLine = "A flight", .codes = kHookedCodes};
+
+TEST(LayoutRecord, AsksItsHookInPlaceOfTheLengthAndLogsOnlyWhatIsAccepted) {
+    LayoutFixture fixture(kHooked);
+    EXPECT_EQ(fixture.feed({6}, 100), (Lines{{4, "A flight"}, {3, "6 of code 100"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary()));
+    EXPECT_EQ(fixture.feed({5}, 100), (Lines{{4, "A flight"}, {6, "1 bytes of code 100"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "5"}}));
+}
+
+TEST(LayoutRecord, LogsTheSectionAsItIsAfterTheRecord) {
+    LayoutFixture fixture(kHooked);
+    fixture.record.display().setLate(true);
+    (void)fixture.feed({5}, 100);
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary())) << "read late";
+    EXPECT_EQ(fixture.feed({9}, 200),
+              (Lines{{4, "A flight"}, {6, "9: { Speed = 5; Height = 9; }"}}))
+        << "with the record before it";
+}
+
+constexpr auto kCheckedLists = std::to_array<ListLayout>({{
+    .entries = {{.start = 2, .stride = 3, .bytesRead = 1}},
+    .count = u8At(0),
+    .fields = kSpeedFields,
+    .sizeCheck = SizeCheck{u8At(1), 2},
+}});
+constexpr auto kCheckedCodes =
+    std::to_array<CodeLayout>({{.logCode = 100, .minimumLength = 2, .lists = kCheckedLists}});
+constexpr RecordLayout kCheckedLayout{
+    .section = "Flights", .logLine = "Flights", .kind = SectionKind::List, .codes = kCheckedCodes};
+
+TEST(LayoutRecord, ARecordThatFailsTheSizeCheckIsLoggedAndEmptiesTheList) {
+    LayoutFixture fixture(kCheckedLayout);
+    const ByteBuffer good = {1, 0, 42, 0, 0};
+    EXPECT_EQ(fixture.feed(good, 100), (Lines{{4, "Flights"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Array{Dictionary{{"Speed", "42"}}}));
+    EXPECT_EQ(
+        fixture.feed({2, 1, 42, 0, 0}, 100),
+        (Lines{{4, "Flights"}, {3, "Unexpected log packet bytes size: expected=6 actual=3"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Array()));
+    (void)fixture.feed(good, 100);
+    EXPECT_EQ(
+        fixture.feed({0, 0, 42}, 100),
+        (Lines{{4, "Flights"}, {3, "Unexpected log packet bytes size: expected=0 actual=3"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Array()));
+    EXPECT_EQ(fixture.feed({9}, 100), (Lines{{4, "Flights"}})) << "not accepted, so not checked";
+}
+
+TEST(LayoutRecord, ANewSectionGetsNothingOfARecordBeforeIt) {
+    LayoutFixture fixture(kReports);
+    fixture.record.display().setLate(true);
+    (void)fixture.feed({7}, 100);
+    const PropertyList later{Dictionary()};
+    fixture.record.updateSectionRef(later);
+    fixture.record.display().bringUpToDate();
+    EXPECT_EQ(later, PropertyList(Dictionary()));
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "7"}}));
+    (void)fixture.feed({8, 0}, 200);
+    fixture.record.display().bringUpToDate();
+    EXPECT_EQ(later, PropertyList(Dictionary{{"Height", "8"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "7"}}));
+}
+
+TEST(LayoutRecord, TheDisplayIsTheSameWhateverTheLogTakes) {
+    for (const int threshold : {SystemLog::kEverything, 0}) {
+        LayoutFixture fixture(kHooked);
+        fixture.record.display().setLate(true);
+        const RecordingLog log(threshold);
+        for (const std::uint8_t byte : std::array<std::uint8_t, 2>{5, 6}) {
+            for (const LogCode logCode : {100, 200, 300}) {
+                const ByteBuffer bytes = {byte};
+                fixture.record.updateWithData(LogRecord(bytes), logCode);
+            }
+        }
+        fixture.record.display().bringUpToDate();
+        EXPECT_EQ(log.lines().empty(), threshold == 0);
+        EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "5"}, {"Height", "6"}}))
+            << threshold;
+    }
+}
+
+constexpr auto kPairFields = std::to_array<Field>(
+    {{"Speed", u8At(0), Conversion::number()}, {"Height", u8At(1), Conversion::number()}});
+constexpr auto kHiddenLists = std::to_array<ListLayout>({
+    {.entries = {{.start = 1, .stride = 2, .bytesRead = 2}},
+     .count = u8At(0),
+     .fields = kPairFields,
+     .isShown = false,
+     .rememberedAs = "it"},
+    {.entries = {{.start = 1, .stride = 2, .bytesRead = 1}},
+     .count = u8At(0),
+     .fields = kSpeedFields},
+});
+constexpr auto kHiddenCodes = std::to_array<CodeLayout>({
+    {.logCode = 100, .minimumLength = 1, .lists = kHiddenLists},
+    {.logCode = 200, .minimumLength = 1, .lists = std::span(kHiddenLists).subspan(1)},
+});
+constexpr RecordLayout kHidden{
+    .section = "Flights", .logLine = "Flights", .kind = SectionKind::List, .codes = kHiddenCodes};
+
+TEST(LayoutRecord, ItsSinkGetsWhatTheDisplayDoesNotShow) {
+    LayoutFixture fixture(kHidden);
+    SampleLines sink;
+    fixture.record.setSink(&sink, 50);
+    (void)fixture.feed({1, 7, 8}, 100);
+    EXPECT_EQ(sink.lines,
+              (std::vector<std::string>{"[ 1", "{0 0", "50 Speed 7 raw 7", "51 Height 8 raw 8", "}",
+                                        "]", "[ 1", "{0 0", "52 Speed 7 raw 7", "}", "]"}));
+    EXPECT_EQ(fixture.section, PropertyList(Array{Dictionary{{"Speed", "7"}}}));
+}
+
+TEST(LayoutRecord, ItsSinkGetsARecordAtOnceThatTheDisplayTakesLater) {
+    LayoutFixture fixture(kHidden);
+    fixture.record.display().setLate(true);
+    SampleLines sink;
+    fixture.record.setSink(&sink, 50);
+    const std::vector<std::string> samples = {"[ 1", "{0 0", "53 Speed 9 raw 9", "}", "]"};
+    (void)fixture.feed({1, 9}, 200);
+    EXPECT_EQ(sink.lines, samples) << "after the three rows of the code before";
+    EXPECT_EQ(fixture.section, PropertyList(Array()));
+    fixture.record.display().bringUpToDate();
+    EXPECT_EQ(sink.lines, samples) << "once";
+    EXPECT_EQ(fixture.section, PropertyList(Array{Dictionary{{"Speed", "9"}}}));
+    fixture.record.setSink(nullptr, 0);
+    (void)fixture.feed({1, 9}, 200);
+    EXPECT_EQ(sink.lines, samples) << "taken away";
+}
+
+} // namespace
+} // namespace pallax
