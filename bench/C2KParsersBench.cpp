@@ -10,9 +10,11 @@
 #include "LogGenerator/C2K/OneXSystemIdentity.h"
 #include "LogGenerator/C2K/OneXTrafficErrors.h"
 #include "LogGenerator/C2K/ReverseDataRate.h"
-#include "bench/MeasureRecord.h"
 #include "tests/doubles/C2KLookupNames.h"
+#include "tests/doubles/RecordBuilder.h"
 #include "tests/doubles/SubpacketBuilder.h"
+
+#include <benchmark/benchmark.h>
 
 #include <initializer_list>
 
@@ -20,7 +22,14 @@ namespace pallax {
 namespace {
 
 using doubles::packetOf;
+using doubles::Record;
 using doubles::Subpacket;
+
+/// Only zeros after the header.
+template <LogCode logCode, std::size_t length>
+Record zeros() {
+    return Record(logCode).padTo(length);
+}
 
 DictionaryRef lookupTable() {
     const auto lookup = std::make_shared<Dictionary>();

@@ -1,35 +1,32 @@
 // The CDMA generator with any sequence of packets; see GeneratorFuzz.h for the input.
 
 #include "LogGenerator/C2K/C2KLogGenerator.h"
+#include "LogGenerator/Records/Layout.h"
 #include "fuzz/GeneratorFuzz.h"
-
-#include <initializer_list>
 
 using namespace pallax; // NOLINT: a program of its own
 
 namespace {
 
-Dictionary rows(std::initializer_list<const char*> lookupNames) {
-    Dictionary section;
-    for (const char* name : lookupNames) {
-        section.setFixed(name, name);
+template <class Rows>
+void showRows(const Rows& rows, Dictionary& section) {
+    for (const auto& row : rows) {
+        section.setFixed(row.key, Text::fixed(row.key));
     }
-    return section;
 }
 
-/// Every lookup name, in the sections of resources/C2KTemplate.plist.
+/// Every lookup name, under itself.
 PropertyList displayTemplate() {
-    return Dictionary{
-        {"System Identity", rows({"kSystemId", "kNetworkId", "kBaseId", "kPacketZoneId",
-                                  "kProtocolRevision", "k1xRoamingHome"})},
-        {"1x",
-         rows({"k1xDeviceState", "k1xTrafficFER", "k1xRx0BandClass", "k1xRx0ChanNum", "k1xRxAGC0",
-               "k1xRx1BandClass", "k1xRx1ChanNum", "k1xRxAGC1", "k1xTxAGC", "k1xActiveSetInfo"})},
-        {"EV-DO", rows({"k1xEVDODeviceState", "kSessionState", "kUATI24", "kColorCode",
-                        "kBandClass", "kChannel", "kServingPNOffset", "kRxAGC0", "kRxAGC1",
-                        "kTxAGC", "kActiveSetPilots", "kFingerC2I"})},
-        {"Data Rates", rows({"kFLDataRate", "kRLDataRate"})},
-    };
+    Dictionary section;
+    for (const CodeLayout* code : C2KLogGenerator::layouts()) {
+        showRows(code->fields, section);
+        showRows(code->lists, section);
+        for (const SubpacketLayout& subpacket : code->subpackets) {
+            showRows(subpacket.fields, section);
+            showRows(subpacket.lists, section);
+        }
+    }
+    return Dictionary{{"Section", std::move(section)}};
 }
 
 } // namespace

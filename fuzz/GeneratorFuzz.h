@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Common/LogCode_0xFF000020.h"
 #include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Records/ClassIndex.h"
 #include "platform/SystemLog.h"
 #include "tests/doubles/GeneratorFixture.h"
 
@@ -12,6 +13,20 @@
 #include <string>
 
 namespace pallax {
+
+/// A template with the section of each record of a class index.
+template <class Index>
+PropertyList sectionsOf() {
+    doubles::FakeStandardOutput output;
+    const Index index(output);
+    Dictionary sections;
+    for (const ClassIndex::Numbered& each : index.records()) {
+        const bool isList = each.record->sectionKind() == SectionKind::List;
+        sections.setFixed(each.record->getSectionName(),
+                          isList ? PropertyList(Array()) : PropertyList(Dictionary()));
+    }
+    return sections;
+}
 
 /// Formats the text of every log line.
 class Listener final : public LogSink {
