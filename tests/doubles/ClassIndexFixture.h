@@ -2,6 +2,8 @@
 
 #include "LogGenerator/Records/ClassIndex.h"
 #include "tests/doubles/FakeStandardOutput.h"
+#include "tests/doubles/GeneratorFixture.h"
+#include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordingLog.h"
 #include "tests/doubles/TemplateCheck.h"
 
@@ -9,6 +11,7 @@
 
 #include <map>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace pallax::doubles {
@@ -20,6 +23,9 @@ protected:
     using Names = std::vector<std::string>;
     /// The sections of a log code's subscribers, in call order.
     using Subscribers = std::map<LogCode, Names>;
+
+    /// A record's section, and how many codes the record subscribes to.
+    using Registrations = std::vector<std::pair<std::string, int>>;
 
     /// Each log code of the table has exactly its subscribers, and no other code has any: the index
     /// wants no others, and `unwanted`, a code outside the table, has none.
@@ -33,32 +39,47 @@ protected:
         EXPECT_EQ(_index.getSubscribers(unwanted), nullptr);
     }
 
-    /// In alphabetical order.
-    Names sections() const {
-        Names names;
-        for (const auto& [name, record] : _index.classes()) {
-            names.push_back(name);
-        }
-        return names;
-    }
-
     /// Compares a template in resources/ with the records, both ways.
     void expectTemplateMatches(const std::string& file) const {
         doubles::expectTemplateMatches(
             propertyListFile(std::string(PALLAX_SOURCE_DIR "/resources/") + file), _index);
     }
 
-    /// The lines of a new index whose records register one after the other, each with this many
-    /// codes.
-    static void expectRegistration(const std::vector<int>& codes) {
+    /// The records of a new index register in this order, each with a line of its number of codes.
+    static void expectRegistration(const Registrations& records) {
         FakeStandardOutput output;
         const RecordingLog log;
         const Index index(output);
+        Registrations seen;
         std::vector<RecordingLog::Line> lines;
-        for (const int count : codes) {
-            lines.push_back({4, "Array Count: " + std::to_string(count)});
+        for (const ClassIndex::Numbered& each : index.records()) {
+            const LayoutRecord& record = *each.record;
+            seen.emplace_back(record.getSectionName(),
+                              static_cast<int>(record.getLogCodeArray().size()));
+            lines.push_back({4, "Array Count: " + std::to_string(seen.back().second)});
         }
+        EXPECT_EQ(seen, records);
         EXPECT_EQ(log.lines(), lines);
+    }
+
+    /// The start command asks for exactly the modem's codes in the table.
+    static void expectStartCommand(const Subscribers& table,
+                                   decltype(Technology::generator) makeGenerator,
+                                   const std::string& templateName) {
+        GeneratorFixture fixture;
+        fixture.resources.add(templateName, Dictionary());
+        Array codes;
+        for (const auto& [logCode, names] : table) {
+            if (logCode < kExtendedLogCodes) {
+                codes.push_back(PropertyList::integer(logCode));
+            }
+        }
+        expectInOrder(
+            makeGenerator(fixture.environment())->getStartCommand(),
+            Dictionary{{"SetState", "Streaming"},
+                       {"SetZorellLogCodes", codes},
+                       {"SetHxExtraCodes", Array{PropertyList::integer(0), PropertyList::integer(1),
+                                                 PropertyList::integer(2)}}});
     }
 
     /// The lines that an index prints on destruction.

@@ -106,7 +106,6 @@ void countNames(const PropertyList& object, std::map<std::string, int>& counts) 
 TEST(C2KTemplate, TheDeliveredOneShowsEveryLookupNameAndNoOther) {
     std::map<std::string, int> counts;
     countNames(propertyListFile(PALLAX_SOURCE_DIR "/resources/C2KTemplate.plist"), counts);
-    EXPECT_EQ(kLookupNames.size(), 30U);
     for (const std::string& name : kLookupNames) {
         EXPECT_GE(counts[name], 1) << name;
     }

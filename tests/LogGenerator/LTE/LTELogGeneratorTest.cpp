@@ -42,42 +42,6 @@ TEST(LTELogGenerator, ItsLifeIsLoggedWithTheBasesDestructionLineUnderTheGSMName)
               (std::vector<std::string>{"Deallocing LTEClassIndex", "Deallocing ClassIndex"}));
 }
 
-TEST(LTELogGenerator, TheStartCommandHoldsExactlyTheCodesOfItsRecords) {
-    GeneratorFixture fixture;
-    const auto generator = LTELogGenerator::generator(fixture.environment());
-    Array codes;
-    for (const LogCode logCode :
-         std::vector<LogCode>{0xB0C1U, 0xB0C2U, 0xB179U, 0xB17FU, 0xB180U, 0xB186U}) {
-        codes.push_back(PropertyList::integer(logCode));
-    }
-    const Array extraCodes = {PropertyList::integer(0), PropertyList::integer(1),
-                              PropertyList::integer(2)};
-    doubles::expectInOrder(generator->getStartCommand(),
-                           Dictionary{{"SetState", "Streaming"},
-                                      {"SetZorellLogCodes", codes},
-                                      {"SetHxExtraCodes", extraCodes}});
-}
-
-TEST(LTELogGenerator, TheDisplayHoldsExactlyTheElevenSectionsInTheirOrder) {
-    LTEFixture fixture;
-    const auto generator = LTELogGenerator::generator(fixture.environment());
-    Dictionary state;
-    generator->updateState(state, Record(0x1234).padTo(200).bytes()); // nobody's
-    doubles::expectInOrder(
-        *state.find("Display"),
-        Dictionary{{"Serving Cell Info", Dictionary()},
-                   {"Serving Cell Measurements", Dictionary()},
-                   {"Connected mode LTE Intra-frequency Measurement", Dictionary()},
-                   {"Measured Neighbor Cells", Array()},
-                   {"Detected Cells", Array()},
-                   {"Neighbor Measurements", Dictionary()},
-                   {"Neighbor Cells List", Array()},
-                   {"Reselection Candidates", Dictionary()},
-                   {"Reselection Candidates List", Array()},
-                   {"SIM Info", Dictionary()},
-                   {"PDP Context Info", Array()}});
-}
-
 TEST(LTELogGenerator, A0xB179IsOfferedToItsThreeRecordsInOrder) {
     LTEFixture fixture;
     const auto generator = LTELogGenerator::generator(fixture.environment());
