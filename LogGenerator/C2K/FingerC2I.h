@@ -6,12 +6,13 @@ namespace pallax {
 
 /// What the fingers of the EV-DO receiver are locked to, and how well.
 ///
-///   0x108A, exactly 23 bytes and 14 for each finger, little-endian
-///   byte  width  lookup name   shown as
-///   22    8                    number of fingers
-///   23           kFingerC2I    list by pilot, or "(none)"
+///   0x108A, at least 23 bytes, and exactly 14 more for each finger, little-endian
+///   byte      width    lookup name   shown as
+///   22        8                      number of fingers
+///   23 + 14i  14 byte  kFingerC2I    list by pilot, or "(none)": finger i
 ///
-///   a finger, 14 bytes
+///   finger
+///   byte  width  field
 ///   0     16     PN offset; 0xFFFF: locked to nothing, not shown
 ///   6     16     carrier to interference: 10 x log10(raw / 512), dB
 extern const CodeLayout kFingerC2I;

@@ -9,7 +9,7 @@ namespace pallax {
 ///   0x134F, at least 171 bytes, version 2 or higher, little-endian
 ///   byte  width  lookup name         shown as
 ///   13    8                          version
-///   42    32     k1xRoamingHome      roaming indicator label
+///   42    32     k1xRoamingHome      label of the roaming indicator
 ///   46    32                         system type
 ///   50    16     kSystemId           number; of a system type other than 2 the type
 ///   52    16     kNetworkId          number; of a system type other than 2 the type

@@ -9,13 +9,13 @@ namespace pallax {
 ///   0xB0C2, at least 38 bytes, little-endian; removes "UARFCN", which its frequencies supersede
 ///   byte  width  key                   shown as
 ///   14    16     Physical Cell ID      number
-///   16    16     Download Frequency    number, the EARFCN
-///   18    16     Upload Frequency      number, the EARFCN
-///   20    8      Download Bandwidth    label of the resource blocks (kBandwidths)
-///   21    8      Upload Bandwidth      label of the resource blocks (kBandwidths)
-///   22    32     Cell Identity         number, signed
+///   16    16     Download Frequency    number; the EARFCN
+///   18    16     Upload Frequency      number; the EARFCN
+///   20    8      Download Bandwidth    label (kBandwidths), "Unknown" beyond; by resource blocks
+///   21    8      Upload Bandwidth      label (kBandwidths), "Unknown" beyond; by resource blocks
+///   22    32     Cell Identity         signed
 ///   26    16     Tracking Area Code    number
-///   28    32     Freq Band Indicator   number, signed
+///   28    32     Freq Band Indicator   signed
 ///
 ///   0xB0C1, at least 22 bytes; the record is shown and then logged as unknown all the same
 ///   byte  width  key                   shown as

@@ -12,10 +12,11 @@ namespace pallax {
 ///   28       8       number of detected cells, D
 ///   29 + 6i  6 byte  entry i
 ///
-///   byte of the entry  width  key               shown as
-///   0                  16     Physical Cell ID  number
-///   2                  16     Filtered RSRP     raw x 0.25 - 140, dBm
-///   4                  16     Filtered RSRQ     raw x 0.125 - 20, dB
+///   entry
+///   byte  width  key               shown as
+///   0     16     Physical Cell ID  number
+///   2     16     Filtered RSRP     raw x 0.25 - 140, dBm
+///   4     16     Filtered RSRQ     raw x 0.125 - 20, dB
 ///
 /// A record without entries, or whose low byte of 6 x N is above that of its length less 2 x D, is
 /// refused with a line in the log, and the list stays empty. That only the low bytes are compared

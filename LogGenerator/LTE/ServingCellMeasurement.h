@@ -19,13 +19,13 @@ namespace pallax {
 ///   24    1    7      Average RSRQ                            raw x 0.25 - 30, dB
 ///   25    0    9      Measured RSSI                           raw x 0.5 - 140, dBm
 ///   26    1    6      Qrxlevmin                               raw x 2 - 140, dBm
-///   26    7    7      P_Max                                   raw - 30, dBm; 64 "Not Present"
-///   27    6    6      Max UE Tx Power                         raw - 30, dBm; 64 "Not Present"
+///   26    7    7      P_Max                                   raw - 30, dBm, 64 "Not Present"
+///   27    6    6      Max UE Tx Power                         raw - 30, dBm, 64 "Not Present"
 ///   29    0    7      Srxlev                                  raw - 30, dBm
 ///   29    7    6      Num of Consecutive DRX Cycles of S < 0  number
-///   30    5    6      S Intra Search                          raw x 2, dB; 32 "Not Present"
-///   31    3    6      S Non Intra Search                      raw x 2, dBm; 32 "Not Present"
-///   32    1    1      Measurement Rules Updated               "False" for 0, else "True"
+///   30    5    6      S Intra Search                          raw x 2, dB, 32 "Not Present"
+///   31    3    6      S Non Intra Search                      raw x 2, dBm, 32 "Not Present"
+///   32    1    1      Measurement Rules Updated               "True", "False" for 0
 ///   32    2    4      Measurement Rules                       number
 ///
 /// "Max UE Tx Power" is too narrow ever to hold 64, so that it is always shown as a power. The two

@@ -10,10 +10,10 @@ namespace pallax {
 ///   0xD00C, see ChannelQuality.h
 ///
 ///   composite channel
-///   byte  width   key        shown as
-///   0     8       CCTRCH ID  number
-///   1     8       TSNUM      number
-///   2     6 byte  SIR        list of six numbers, one a byte
+///   byte    width  key        shown as
+///   0       8      CCTRCH ID  number
+///   1       8      TSNUM      number
+///   2 + 1i  8      SIR        list of six numbers
 ///
 /// Short records and other codes are ignored silently.
 class CCTRCHSIRMeasurement final : public LayoutRecord {

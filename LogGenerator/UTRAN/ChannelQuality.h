@@ -9,7 +9,7 @@
 ///   14             6    6       number of transport channels, T (the low bits in byte 14)
 ///   15             4    4       number of coded composite transport channels, S
 ///   17 + 2i             2 byte  transport channel i
-///   289 + 34T + 8j      8 byte  composite channel j
+///   289 + 34T + 8i      8 byte  composite channel i
 ///
 /// The composite channels begin at their fixed place, however few bytes the transport channels
 /// take before it.

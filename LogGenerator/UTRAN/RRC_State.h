@@ -6,7 +6,7 @@ namespace pallax {
 
 /// The state of the radio resource control, section "RRC Info".
 ///
-///   0xD0E0
+///   0xD0E0, at least 13 bytes
 ///   byte  width  key    shown as
 ///   13    8             record version
 ///   14    8      State  label (kModes), "Unknown RRC Mode" beyond

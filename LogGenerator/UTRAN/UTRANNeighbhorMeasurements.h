@@ -15,9 +15,9 @@ namespace pallax {
 ///   byte  bit  width  key          shown as
 ///   0     0    14     UARFCN       number
 ///   1     6    7      Cell ID      number
-///   2     5    8      Filter RSCP  raw / 256, six decimals
+///   2     5    8      Filter RSCP  raw x 0.00390625; six decimals
 ///   3     5    2      Status       label (kStatuses); no key for 3
-///   3     7    1      inJDCS       "TRUE" or "FALSE"
+///   3     7    1      inJDCS       "TRUE", "FALSE" for 0
 ///
 /// Short records and other codes are ignored silently.
 class UTRANNeighbhorMeasurements final : public LayoutRecord {

@@ -13,7 +13,7 @@ namespace pallax {
 ///   19    16     Downlink UARFCN           number
 ///   17    16     Uplink UARFCN             number
 ///   15    8      URA ID                    number
-///   25    1      Allowed Access            "All Calls", or "Emergency Calls Only" for bit 0
+///   25    1      Allowed Access            "Emergency Calls Only", "All Calls" for 0
 ///
 ///   0xFF0001, the cell-monitor array: every serving cell of UTRAN, so that the last one stays
 ///   constant                key                   shown as
@@ -21,8 +21,8 @@ namespace pallax {
 ///   kHXCellMonitorCellId    Cell ID               number
 ///   kHXCellMonitorBandInfo  Freq Band Indicator   number
 ///   kHXCellMonitorSCN       Cell Scrambling Code  number
-///   kHXCellMonitorUARFCN    Uplink UARFCN         number, the same under both keys
-///                           Downlink UARFCN
+///   kHXCellMonitorUARFCN    Uplink UARFCN         number; the same under both keys
+///   kHXCellMonitorUARFCN    Downlink UARFCN       number
 ///
 /// Short records and other codes are ignored silently.
 class UTRANServingCellInfo final : public LayoutRecord {

@@ -10,7 +10,7 @@ namespace pallax {
 ///   byte     width   key                    shown as
 ///   13       8                              channel count
 ///   14       16      Window Size            number
-///   16 + 9i  9 byte                         channel i, listed under "Transport Channels"
+///   16 + 9i  9 byte  Transport Channels     channel i
 ///
 ///   channel
 ///   byte  width  key                    shown as

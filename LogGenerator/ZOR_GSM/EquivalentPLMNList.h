@@ -7,9 +7,9 @@ namespace pallax {
 /// The networks that the current one treats as equivalent, section "Equivalent PLMN List".
 ///
 ///   0x7150, at least 17 bytes
-///   byte  width  field
-///   16    8      number of entries
-///   17           entries, each 3 bytes behind the one before it, though 6 bytes are read of each
+///   byte     width   field
+///   16       8       number of entries
+///   17 + 3i  6 byte  entry i
 ///
 ///   entry
 ///   byte        key                    shown as

@@ -16,8 +16,8 @@ namespace pallax {
 ///   0x5137, at least 29 bytes
 ///   byte  width  key                 shown as
 ///   15    8      Serving Rx Level    number
-///   16    32     Rx Quality Full     number, signed
-///   20    32     Rx Quality Sub      number, signed
+///   16    32     Rx Quality Full     signed
+///   20    32     Rx Quality Sub      signed
 ///
 ///   0x5072, at least 20 bytes
 ///   byte  width  key                 shown as

@@ -15,14 +15,15 @@ namespace pallax {
 ///   0x5137, at least 29 bytes
 ///   byte  width  key                   shown as
 ///   15    8      RSSI                  number, dBm; the byte as it is, a positive number
-///   16    16     C1 Value              number, unsigned
-///   20    16     C2 Value              number, unsigned
+///   16    16     C1 Value              number; unsigned
+///   20    16     C2 Value              number; unsigned
 ///
 ///   0x5076, at least 17 bytes
 ///   byte  width  key                   shown as
 ///   13    8      MA Dedicated ARFCN    number; the low byte of a wider field
 ///
 ///   0xFF0001, the cell-monitor array: the first serving cell of GSM
+///   constant                key        shown as
 ///   kHXCellMonitorCellId    Cell ID    number
 ///   kHXCellMonitorARFCN     ARFCN      number
 ///

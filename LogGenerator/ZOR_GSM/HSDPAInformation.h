@@ -8,15 +8,15 @@ namespace pallax {
 /// processes of a kind leaves the list of that kind as it was.
 ///
 ///   0x4221, at least 18 bytes, little-endian
-///   byte             bit  width   key           shown as
-///   13               0    8       Version       number
-///   14               0    10      Sub Frames    number
-///   15               2    2       Carrier Info  label (kCarriers)
-///   16               0    8                     primary process count p
-///   17               0    8                     secondary process count s
-///   18 + 9i               9 byte                process i of "Primary HARQ Process"
-///   18 + 162p + 9i        9 byte                process i of "Secondary HARQ Process": 162 bytes
-///                                               behind 18 for each primary process, not 9
+///   byte             bit  width   key                     shown as
+///   13               0    8       Version                 number
+///   14               0    10      Sub Frames              number
+///   15               2    2       Carrier Info            label (kCarriers), "Unknown" beyond
+///   16               0    8                               primary process count p
+///   17               0    8                               secondary process count s
+///   18 + 9i               9 byte  Primary HARQ Process    process i
+///   18 + 162p + 9i        9 byte  Secondary HARQ Process  process i: 162 bytes behind 18 for each
+///                                                         primary process, not 9
 ///
 ///   process
 ///   byte  width  key           shown as

@@ -7,10 +7,10 @@ namespace pallax {
 /// The hopping sequence of the serving cell, section "Mobile Allocation".
 ///
 ///   0x51F8, at least 15 bytes
-///   byte  width  key       shown as
-///   13    8      HSN       number
-///   14    8                number of channels
-///   15    16     ARFCNs    array of numbers, one for each channel
+///   byte     width  key       shown as
+///   13       8      HSN       number
+///   14       8                number of channels
+///   15 + 2i  16     ARFCNs    array of numbers, one for each channel
 ///
 /// The array is a new one after each record.
 class MobileAllocation final : public LayoutRecord {

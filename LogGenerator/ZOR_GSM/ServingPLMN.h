@@ -11,19 +11,19 @@ namespace pallax {
 ///   14    8      PLMN Sel Mod          label (kSelectionModes), "Unknown" beyond
 ///
 ///   0x7135, at least 32 bytes; keys in this order
-///   byte  nibble    key                    shown as
-///   15    low       Mobile Country Code    digit 1
-///   15    high                             digit 2
-///   16    low                              digit 3
-///   17    low       Mobile Network Code    digit 1
-///   17    high                             digit 2
-///   16    high                             digit 3
-///   byte  width
-///   18    16        Location Area Code     number, big-endian
-///   20    8         Routing Area Code      number
-///   14    8         Service Type           label (kServiceTypes), "Unknown" beyond
+///   byte  bit  width  key                    shown as
+///   15    0    4      Mobile Country Code    digit 1
+///   15    4    4                             digit 2
+///   16    0    4                             digit 3
+///   17    0    4      Mobile Network Code    digit 1
+///   17    4    4                             digit 2
+///   16    4    4                             digit 3
+///   18    0    16     Location Area Code     number, big-endian
+///   20    0    8      Routing Area Code      number
+///   14    0    8      Service Type           label (kServiceTypes), "Unknown" beyond
 ///
 ///   0xFF0001, the cell-monitor array: the first serving cell of GSM or UMTS
+///   constant             key                    shown as
 ///   kHXCellMonitorMCC    Mobile Country Code    number
 ///   kHXCellMonitorMNC    Mobile Network Code    number
 ///   kHXCellMonitorLAC    Location Area Code     number

@@ -19,14 +19,14 @@ namespace pallax {
 ///
 ///   0x4157, at least 19 bytes
 ///   byte  width  key                 shown as
-///   13    8      Ciphering           "Enabled" unless 0, which is "Disabled"
+///   13    8      Ciphering           "Enabled", "Disabled" for 0
 ///
 ///   0x4031, at least 16 bytes, little-endian
-///   byte      width    field
-///   14        8        entry count
-///   16 + 14i  14 byte  entry i, at whose byte 4 stands a signed 16-bit raw power v
-///   "Transmit Power" is the mean, in dBm, of (v + 512) / 10 toward zero - 70 over the entries
-///   whose v is not 0; of none, it is no number.
+///   byte      width    key             shown as
+///   14        8                        entry count
+///   16 + 14i  14 byte                  entry i, at whose byte 4 stands a signed 16-bit raw power v
+///                      Transmit Power  mean, in dBm, of (v + 512) / 10 toward zero - 70 over the
+///                                      entries whose v is not 0; of none, it is no number
 ///
 ///   0xFF0001, the cell-monitor array: the first UMTS serving cell
 ///   constant              key              shown as

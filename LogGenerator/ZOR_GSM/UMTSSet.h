@@ -16,7 +16,7 @@ namespace pallax {
 ///   byte  width  key                 shown as
 ///   2     16     Scrambling Code     number
 ///   4     8      RSCP                signed - 21, dB
-///   7     8      Energy Per Chip     signed x 0.5, six decimals, dB
+///   7     8      Energy Per Chip     signed x 0.5, dB; six decimals
 ///   0     16     Downlink Frequency  signed
 ///   8     16     Ranking Value       signed
 ///   5     16     Rank Cell RSCP      signed, dB
@@ -25,8 +25,8 @@ namespace pallax {
 ///   constant              key              shown as
 ///   kHXCellMonitorUARFCN  UARFCN           number
 ///   kHXCellMonitorSCN     Scrambling Code  number
-///   kHXCellMonitorRSCP    RSCP             low 16 bits, signed, dBm; empty for 32767
-///   kHXCellMonitorECN0    Energy Per Chip  low 16 bits, signed, dB; empty for 32767
+///   kHXCellMonitorRSCP    RSCP             signed, dBm, empty for 32767; of the low 16 bits
+///   kHXCellMonitorECN0    Energy Per Chip  signed, dB, empty for 32767; of the low 16 bits
 class UMTSSet final : public LayoutRecord {
 public:
     UMTSSet();

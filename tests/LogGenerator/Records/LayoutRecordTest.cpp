@@ -119,6 +119,33 @@ TEST(LayoutRecord, LogsTheSectionAsItIsAfterTheRecord) {
         << "with the record before it";
 }
 
+constexpr Condition kFirstIsFive{u8At(0), 5, 5};
+/// Each with one reason to look at a record twice.
+constexpr auto kPickyCodes = std::to_array<CodeLayout>({
+    {.logCode = 100, .minimumLength = 1, .exactLength = true, .fields = kSpeedFields},
+    {.logCode = 200, .condition = &kFirstIsFive, .fields = kSpeedFields},
+    {.logCode = 300, .fields = kSpeedFields, .accepts = acceptsFives},
+    {.logCode = 400, .fields = kSpeedFields, .logs = logsLength},
+});
+constexpr RecordLayout kPicky{.section = "Flight", .logLine = "A flight", .codes = kPickyCodes};
+
+TEST(LayoutRecord, ReadsOnlyWhatItsCodeAllows) {
+    const Lines silence = {{4, "A flight"}};
+    LayoutFixture fixture(kPicky);
+    EXPECT_EQ(fixture.feed({5, 6}, 100), silence);
+    EXPECT_EQ(fixture.feed({6}, 200), silence);
+    EXPECT_EQ(fixture.feed({6}, 300), (Lines{{4, "A flight"}, {3, "6 of code 300"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary()));
+    EXPECT_EQ(fixture.feed({1}, 100), silence);
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "1"}}));
+    for (const LogCode logCode : std::vector<LogCode>{200, 300}) {
+        EXPECT_EQ(fixture.feed({5, 6}, logCode), silence);
+        EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "5"}}));
+    }
+    EXPECT_EQ(fixture.feed({6}, 400), (Lines{{4, "A flight"}, {6, "1 bytes of code 400"}}));
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "6"}}));
+}
+
 constexpr auto kCheckedLists = std::to_array<ListLayout>({{
     .entries = {{.start = 2, .stride = 3, .bytesRead = 1}},
     .count = u8At(0),
@@ -183,18 +210,18 @@ TEST(LayoutRecord, TheDisplayIsTheSameWhateverTheLogTakes) {
 constexpr auto kPairFields = std::to_array<Field>(
     {{"Speed", u8At(0), Conversion::number()}, {"Height", u8At(1), Conversion::number()}});
 constexpr auto kHiddenLists = std::to_array<ListLayout>({
+    {.entries = {{.start = 1, .stride = 2, .bytesRead = 1}},
+     .count = u8At(0),
+     .fields = kSpeedFields},
     {.entries = {{.start = 1, .stride = 2, .bytesRead = 2}},
      .count = u8At(0),
      .fields = kPairFields,
      .isShown = false,
      .rememberedAs = "it"},
-    {.entries = {{.start = 1, .stride = 2, .bytesRead = 1}},
-     .count = u8At(0),
-     .fields = kSpeedFields},
 });
 constexpr auto kHiddenCodes = std::to_array<CodeLayout>({
     {.logCode = 100, .minimumLength = 1, .lists = kHiddenLists},
-    {.logCode = 200, .minimumLength = 1, .lists = std::span(kHiddenLists).subspan(1)},
+    {.logCode = 200, .minimumLength = 1, .lists = std::span(kHiddenLists).first(1)},
 });
 constexpr RecordLayout kHidden{
     .section = "Flights", .logLine = "Flights", .kind = SectionKind::List, .codes = kHiddenCodes};
@@ -205,8 +232,8 @@ TEST(LayoutRecord, ItsSinkGetsWhatTheDisplayDoesNotShow) {
     fixture.record.setSink(&sink, 50);
     (void)fixture.feed({1, 7, 8}, 100);
     EXPECT_EQ(sink.lines,
-              (std::vector<std::string>{"[ 1", "{0 0", "50 Speed 7 raw 7", "51 Height 8 raw 8", "}",
-                                        "]", "[ 1", "{0 0", "52 Speed 7 raw 7", "}", "]"}));
+              (std::vector<std::string>{"[ 1", "{0 0", "50 Speed 7 raw 7", "}", "]", "[ 1", "{0 0",
+                                        "51 Speed 7 raw 7", "52 Height 8 raw 8", "}", "]"}));
     EXPECT_EQ(fixture.section, PropertyList(Array{Dictionary{{"Speed", "7"}}}));
 }
 
