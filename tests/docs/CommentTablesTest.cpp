@@ -264,11 +264,16 @@ void expectTablesMatch(const std::string& path, std::span<const CodeLayout> code
     }
 }
 
+const std::vector<std::string>& headers() {
+    static const std::vector<std::string> all = sourceFiles({".h"});
+    return all;
+}
+
 /// The one header in the folder, or among the common records, whose comment names the section.
 std::string headerOf(std::string_view section, const std::string& folder) {
     std::vector<std::string> found;
     const std::string phrase = "section \"" + std::string(section) + "\"";
-    for (const std::string& path : sourceFiles({".h"})) {
+    for (const std::string& path : headers()) {
         const std::string in = doubles::folderOf(path);
         if ((in == folder || in == "LogGenerator/Common") &&
             replaced(sourceText(path), "\n/// ", " ").find(phrase) != std::string::npos) {
@@ -306,13 +311,13 @@ TEST(CommentTables, OfTheUtranRecordsTellTheirLayouts) {
 TEST(CommentTables, OfTheCdmaCodesTellTheirLayouts) {
     for (const CodeLayout* code : C2KLogGenerator::layouts()) {
         const std::string title = formatText("///   0x%04X", {code->logCode});
-        std::vector<std::string> headers = sourceFiles({".h"});
-        std::erase_if(headers, [&](const std::string& path) {
+        std::vector<std::string> found = headers();
+        std::erase_if(found, [&](const std::string& path) {
             return doubles::folderOf(path) != "LogGenerator/C2K" ||
                    sourceText(path).find(title) == std::string::npos;
         });
-        ASSERT_EQ(headers.size(), 1U) << title;
-        expectTablesMatch(headers.front(), std::span(code, 1));
+        ASSERT_EQ(found.size(), 1U) << title;
+        expectTablesMatch(found.front(), std::span(code, 1));
     }
 }
 

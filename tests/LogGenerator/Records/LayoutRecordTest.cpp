@@ -207,8 +207,59 @@ TEST(LayoutRecord, TheDisplayIsTheSameWhateverTheLogTakes) {
     }
 }
 
+constexpr auto kShapedFields = std::to_array<Field>({
+    kSpeedFields[0],
+    Field{"Climb", u8At(1), Conversion::number()}.when(kFirstIsFive),
+});
+constexpr auto kShapedCodes =
+    std::to_array<CodeLayout>({{.logCode = 100, .fields = kShapedFields}});
+constexpr RecordLayout kShaped{.section = "Flight", .logLine = "A flight", .codes = kShapedCodes};
+
+TEST(LayoutRecord, ALateRecordLosesNothingOfOneThatSetOtherKeys) {
+    LayoutFixture fixture(kShaped);
+    fixture.record.display().setLate(true);
+    (void)fixture.feed({5, 9}, 100);
+    (void)fixture.feed({6, 8}, 100);
+    fixture.record.display().bringUpToDate();
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Speed", "6"}, {"Climb", "9"}}));
+}
+
 constexpr auto kPairFields = std::to_array<Field>(
     {{"Speed", u8At(0), Conversion::number()}, {"Height", u8At(1), Conversion::number()}});
+PropertyList heightOfSpeed(const Place& place) {
+    const auto found = place.memory->remembered.find(place.here.u8(0));
+    return found != place.memory->remembered.end() ? DisplayNumber(found->second, kDecimal)
+                                                   : PropertyList();
+}
+constexpr Computation kHeightOfSpeed{
+    .name = "", .formula = "", .read = {}, .compute = heightOfSpeed};
+constexpr auto kRememberedFields = std::to_array<Field>({computed("Height", kHeightOfSpeed)});
+constexpr auto kRememberedLists = std::to_array<ListLayout>({{
+    .entries = {{.start = 0, .stride = 2, .bytesRead = 2}},
+    .fields = kPairFields,
+    .plus = 1,
+    .isShown = false,
+    .rememberedAs = "it",
+}});
+constexpr auto kRememberedCodes = std::to_array<CodeLayout>({
+    {.logCode = 100, .lists = kRememberedLists},
+    {.logCode = 200, .fields = kRememberedFields},
+});
+constexpr RecordLayout kRemembered{
+    .section = "Flight", .logLine = "A flight", .codes = kRememberedCodes};
+
+TEST(LayoutRecord, ALateRecordLooksUpWhatWasRememberedWhenItArrived) {
+    LayoutFixture fixture(kRemembered);
+    fixture.record.display().setLate(true);
+    (void)fixture.feed({7, 80}, 100);
+    (void)fixture.feed({7}, 200);
+    (void)fixture.feed({7, 90}, 100);
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Height", "80"}}));
+    (void)fixture.feed({7}, 200);
+    fixture.record.display().bringUpToDate();
+    EXPECT_EQ(fixture.section, PropertyList(Dictionary{{"Height", "90"}}));
+}
+
 constexpr auto kHiddenLists = std::to_array<ListLayout>({
     {.entries = {{.start = 1, .stride = 2, .bytesRead = 1}},
      .count = u8At(0),
