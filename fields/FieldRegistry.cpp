@@ -84,11 +84,12 @@ public:
             for (const CodeDescription& code : section.codes) {
                 addCode(code);
             }
-            for (const std::string& key : section.objectKeys) {
+            for (const ObjectKey& key : section.objectKeys) {
                 addObjectKey(key);
             }
             if (isObjectStream && section.objectKeys.empty()) {
-                addObjectKey(""); // the section, or an entry of it, is the value itself
+                // The section is the value itself, or a list of values that are their own identity.
+                addObjectKey({.name = "", .isIdentifying = section.isList});
             }
         }
         addIdentities();
@@ -136,14 +137,11 @@ private:
         std::tie(_name, _path, _listKey, _isInList, _isShown) = around;
     }
 
-    void addObjectKey(const std::string& key) {
+    void addObjectKey(const ObjectKey& key) {
         const std::string path = _path;
         _isInList = _section->isList;
         _path += _isInList ? "/*" : "";
-        FieldInfo& info = infoOf(key, FieldInfo::Kind::Text);
-        const std::vector<std::string>& identifying = _section->identifyingKeys;
-        info.identifies =
-            std::find(identifying.begin(), identifying.end(), key) != identifying.end();
+        infoOf(key.name, FieldInfo::Kind::Text).identifies = key.isIdentifying;
         _path = path;
         _isInList = false;
     }

@@ -105,6 +105,21 @@ std::optional<CodeDescription> shownIn(const Places& places, const CodeDescripti
     return any ? std::optional(std::move(shown)) : std::nullopt;
 }
 
+/// What a section tells, as a sentence: the template names sections only.
+std::string_view cdmaSectionMeaning(std::string_view section) {
+    static constexpr auto kMeanings = std::to_array<std::pair<std::string_view, std::string_view>>({
+        {"System Identity", "Which 1x system serves the phone."},
+        {"1x", "State and radio of the 1x device."},
+        {"1x / Receiver 0", "The first receiver of the 1x device."},
+        {"1x / Receiver 1", "The second receiver of the 1x device, shown while in Traffic."},
+        {"EV-DO", "State, session and radio of EV-DO."},
+        {"Data Rates", "What the EV-DO links carry."},
+    });
+    const auto* found = std::find_if(kMeanings.begin(), kMeanings.end(),
+                                     [section](const auto& each) { return each.first == section; });
+    return found != kMeanings.end() ? found->second : std::string_view();
+}
+
 /// A section for each dictionary of the template that shows a lookup name.
 void appendPlaces(const Dictionary& entries, const std::string& name, const std::string& path,
                   const std::vector<CodeDescription>& codes,
@@ -117,6 +132,7 @@ void appendPlaces(const Dictionary& entries, const std::string& name, const std:
     }
     if (!places.empty()) {
         SectionReference section{name, path};
+        section.meaning = cdmaSectionMeaning(name);
         for (const CodeDescription& code : codes) {
             if (auto shown = shownIn(places, code)) {
                 section.codes.push_back(std::move(*shown));
@@ -145,42 +161,24 @@ std::vector<SectionReference> cdmaSections(const Resources& resources) {
     return sections;
 }
 
-std::vector<SectionReference> ifxSectionsOf(const Resources& /*resources*/) {
-    return ifxSections();
-}
-
-Meanings noMeanings() {
-    return {};
-}
-
 struct Source {
     std::string_view commandName;
     std::string_view title;
     std::vector<SectionReference> (*sections)(const Resources& resources);
-    Meanings (*meanings)(); ///< those that stand in no layout
 };
 
 constexpr auto kSources = std::to_array<Source>({
-    {"ifx", "IFX", ifxSectionsOf, ifxMeanings},
-    {"gsm", "GSM/UMTS", gsmSections, gsmMeanings},
-    {"cdma", "CDMA", cdmaSections, cdmaMeanings},
-    {"lte", "LTE", lteSections, noMeanings},
-    {"utran", "UTRAN", utranSections, utranMeanings},
+    {"ifx", "IFX", ifxSections},
+    {"gsm", "GSM/UMTS", gsmSections},
+    {"cdma", "CDMA", cdmaSections},
+    {"lte", "LTE", lteSections},
+    {"utran", "UTRAN", utranSections},
 });
 
 const Source& sourceOf(std::string_view commandName) {
     return *std::find_if(kSources.begin(), kSources.end(), [commandName](const Source& source) {
         return source.commandName == commandName;
     });
-}
-
-std::string_view sentenceOf(const Meanings& meanings, std::string_view section,
-                            std::string_view key) {
-    const auto found =
-        std::find_if(meanings.keys.begin(), meanings.keys.end(), [&](const Meaning& meaning) {
-            return meaning.section == section && meaning.key == key;
-        });
-    return found != meanings.keys.end() ? found->sentence : std::string_view();
 }
 
 std::string_view sentenceOf(const std::vector<FieldDescription>& fields,
@@ -205,6 +203,11 @@ std::string_view sentenceOf(const std::vector<FieldDescription>& fields,
 std::string_view sentenceOf(const SectionReference& section, std::string_view key) {
     if (key.empty()) {
         return section.meaning;
+    }
+    for (const ObjectKey& each : section.objectKeys) {
+        if (each.name == key) {
+            return each.meaning;
+        }
     }
     for (const CodeDescription& code : section.codes) {
         std::string_view sentence = sentenceOf(code.fields, code.lists, key);
@@ -231,13 +234,6 @@ std::string_view nameIn(const std::vector<SectionReference>& sections, LogCode l
     return {};
 }
 
-std::string_view nameIn(const Meanings& meanings, LogCode logCode) {
-    const auto found =
-        std::find_if(meanings.codes.begin(), meanings.codes.end(),
-                     [logCode](const CodeName& each) { return each.logCode == logCode; });
-    return found != meanings.codes.end() ? found->name : std::string_view();
-}
-
 } // namespace
 
 std::vector<TechnologyReference> gatherReference(const Resources& resources) {
@@ -254,28 +250,16 @@ TechnologyReference gatherReference(const RecordedTechnology& technology,
     return {&technology, source.title, source.sections(resources)};
 }
 
-Meanings meaningsOf(const TechnologyReference& technology) {
-    return sourceOf(technology.technology->commandName).meanings();
-}
-
 std::string_view TechnologyReference::meaningOf(std::string_view section,
                                                 std::string_view key) const {
     const auto found =
         std::find_if(sections.begin(), sections.end(),
                      [section](const SectionReference& each) { return each.name == section; });
-    std::string_view sentence = found != sections.end() ? sentenceOf(*found, key) : "";
-    if (sentence.empty()) {
-        sentence = sentenceOf(meaningsOf(*this), section, key);
-    }
-    return !sentence.empty() ? sentence : sentenceOf(commonMeanings(), section, key);
+    return found != sections.end() ? sentenceOf(*found, key) : std::string_view();
 }
 
 std::string_view TechnologyReference::nameOf(LogCode logCode) const {
-    std::string_view name = nameIn(sections, logCode);
-    if (name.empty()) {
-        name = nameIn(meaningsOf(*this), logCode);
-    }
-    return !name.empty() ? name : nameIn(commonMeanings(), logCode);
+    return nameIn(sections, logCode);
 }
 
 std::vector<LogCode> codesOf(const TechnologyReference& technology) {

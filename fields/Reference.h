@@ -1,7 +1,6 @@
 #pragma once
 
 #include "fields/Description.h"
-#include "fields/Meanings.h"
 #include "platform/Resources.h"
 
 #include <string>
@@ -12,6 +11,13 @@ namespace pallax {
 
 struct RecordedTechnology;
 
+/// A key of an IFX section, which has no log code.
+struct ObjectKey {
+    std::string name;
+    std::string_view meaning{}; ///< a sentence
+    bool isIdentifying = false; ///< it says which cell an entry is
+};
+
 /// One section of a technology's display and its log codes.
 struct SectionReference {
     std::string name; ///< of CDMA: the path in the template, "1x / Receiver 0"
@@ -20,11 +26,8 @@ struct SectionReference {
     /// Every log code that the section's record subscribes to, even if it shows nothing. The keys
     /// are display keys, for CDMA too.
     std::vector<CodeDescription> codes = {};
-    /// IFX: the keys, which have no log code.
-    std::vector<std::string> objectKeys = {};
-    std::vector<std::string> identifyingKeys = {}; ///< of those: which cell an entry is
-    /// Of the section: a sentence, where its layout holds one.
-    std::string_view meaning = {};
+    std::string_view meaning = {}; ///< a sentence
+    std::vector<ObjectKey> objectKeys = {};
 };
 
 struct TechnologyReference {
@@ -44,10 +47,6 @@ std::vector<TechnologyReference> gatherReference(const Resources& resources);
 /// The same of one technology, which needs only its own template.
 TechnologyReference gatherReference(const RecordedTechnology& technology,
                                     const Resources& resources);
-
-/// The sentences of a technology that stand in no layout, without those that several have in
-/// common.
-Meanings meaningsOf(const TechnologyReference& technology);
 
 /// The codes of a technology that a section reads, ascending, each once.
 std::vector<LogCode> codesOf(const TechnologyReference& technology);

@@ -69,11 +69,10 @@ CodeText textOf(const TechnologyReference& technology, const SectionReference& s
             demandsOf(code), tables.taken()};
 }
 
-ReferenceTable objectTable(const TechnologyReference& technology, const SectionReference& section) {
+ReferenceTable objectTable(const SectionReference& section) {
     ReferenceTable table;
-    for (const std::string& key : section.objectKeys) {
-        table.rows.push_back(
-            {"", "", key, "", "", std::string(technology.meaningOf(section.name, key))});
+    for (const ObjectKey& key : section.objectKeys) {
+        table.rows.push_back({"", "", key.name, "", "", std::string(key.meaning)});
     }
     return table;
 }

@@ -35,6 +35,6 @@ CodeText textOf(const TechnologyReference& technology, const SectionReference& s
                 const CodeDescription& code);
 
 /// For IFX: the keys and their meanings.
-ReferenceTable objectTable(const TechnologyReference& technology, const SectionReference& section);
+ReferenceTable objectTable(const SectionReference& section);
 
 } // namespace pallax

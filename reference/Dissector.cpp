@@ -110,8 +110,8 @@ private:
         for (const SectionReference& section : _technology.sections) {
             _filter = fieldWord(section.name);
             LuaTable keys;
-            for (const std::string& key : section.objectKeys) {
-                keys.raw("[" + luaText(key) + "]", luaText(filterOf(key)));
+            for (const ObjectKey& key : section.objectKeys) {
+                keys.raw("[" + luaText(key.name) + "]", luaText(filterOf(key.name)));
             }
             line(3, "[" + luaText(section.name) + "] = { filter = " + luaText(_filter) +
                         ", keys = " + keys.str() + " },");

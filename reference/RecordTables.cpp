@@ -81,7 +81,7 @@ std::string sectionOf(const TechnologyReference& technology, const SectionRefere
             text += tableOf(table);
         }
     }
-    return text + objectTableOf(objectTable(technology, section));
+    return text + objectTableOf(objectTable(section));
 }
 
 } // namespace

@@ -66,7 +66,7 @@ std::string roffSection(const TechnologyReference& technology, const SectionRefe
             text += roffTable(table);
         }
     }
-    return text + roffTable(objectTable(technology, section));
+    return text + roffTable(objectTable(section));
 }
 
 std::string headingOf(const TechnologyReference& technology) {

@@ -69,9 +69,12 @@ inline std::set<std::string> keysOf(const CodeDescription& code, bool shown) {
 inline Keys shownKeys(const TechnologyReference& technology) {
     Keys keys;
     for (const SectionReference& section : technology.sections) {
-        keys[section.name].insert(section.objectKeys.begin(), section.objectKeys.end());
+        std::set<std::string>& itsKeys = keys[section.name];
+        for (const ObjectKey& key : section.objectKeys) {
+            itsKeys.insert(key.name);
+        }
         for (const CodeDescription& code : section.codes) {
-            keys[section.name].merge(keysOf(code, true));
+            itsKeys.merge(keysOf(code, true));
         }
     }
     return keys;
