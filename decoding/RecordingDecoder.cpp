@@ -23,7 +23,7 @@ std::optional<std::string> RecordingDecoder::add(const RecordedPacket& packet) {
     _lastPacket = packet.time;
     ++_packets;
     try {
-        _driver.update(packet.data);
+        _driver.update(packet.data, {_packets, packet.time});
     } catch (const TemplateFailure&) {
         throw;
     } catch (const std::exception& error) {

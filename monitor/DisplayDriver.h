@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/LogGenerator.h"
+#include "LogGenerator/Records/Sample.h"
 #include "plist/PropertyList.h"
 
 #include <memory>
@@ -17,17 +18,34 @@ public:
     void setGenerator(std::unique_ptr<LogGenerator> generator) {
         (void)display();
         _generator = std::move(generator);
+        setSampleSink(_sink);
+    }
+    /// Gives the samples of later packets to `sink`, too, until it is null. The sink outlives the
+    /// driver, or is taken away.
+    void setSampleSink(SampleSink* sink) {
+        _sink = sink;
+        if (_generator) {
+            _generator->setSampleSink(sink);
+        }
     }
     const LogGenerator* generator() const { return _generator.get(); }
     /// True when the generator cannot update the display that an earlier one has left.
     bool keepsDisplay() const { return _generator && _generator->keepsDisplay(_state); }
 
-    /// One packet. An exception of a record leaves, and the packet is then no new data.
-    void update(Bytes packet) {
-        if (_generator) {
-            _generator->updateState(_state, packet);
+    /// One packet; `origin` is for the sink of samples, to which it begins and ends in any case. An
+    /// exception of a record leaves, and the packet is then no new data.
+    void update(Bytes packet, const SamplePacket& origin = {}) {
+        if (_sink == nullptr) {
+            return updateState(packet);
         }
-        _updated = true;
+        _sink->beginPacket(origin);
+        try {
+            updateState(packet);
+        } catch (...) {
+            _sink->endPacket();
+            throw;
+        }
+        _sink->endPacket();
     }
     /// At a display tick: whether packets have arrived since the tick before.
     bool takeUpdated() { return std::exchange(_updated, false); }
@@ -48,8 +66,16 @@ public:
     }
 
 private:
+    void updateState(Bytes packet) {
+        if (_generator) {
+            _generator->updateState(_state, packet);
+        }
+        _updated = true;
+    }
+
     std::unique_ptr<LogGenerator> _generator; // goes after the state
     Dictionary _state;
+    SampleSink* _sink = nullptr;
     bool _updated = false;
 };
 

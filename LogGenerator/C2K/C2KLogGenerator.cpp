@@ -137,6 +137,10 @@ void C2KLogGenerator::bringDisplayUpToDate() {
     _display->bringUpToDate();
 }
 
+void C2KLogGenerator::setSampleSink(SampleSink* sink) {
+    _display->setSink(sink);
+}
+
 PropertyList C2KLogGenerator::generateLogUsingState(Dictionary& state) {
     bringDisplayUpToDate();
     PropertyList display = getDisplayFromState(state);

@@ -28,6 +28,7 @@ public:
 
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
+    void setSampleSink(SampleSink* sink) override;
     /// Not where the state also holds the places of its values, which an earlier one has left.
     bool keepsDisplay(const Dictionary& state) const override;
     PropertyList getStartCommand() const override;

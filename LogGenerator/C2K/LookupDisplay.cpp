@@ -1,6 +1,7 @@
 #include "LogGenerator/C2K/LookupDisplay.h"
 
 #include "LogGenerator/C2K/C2KLookup.h"
+#include "LogGenerator/Records/DisplayAndSink.h"
 #include "LogGenerator/Records/LayoutReader.h"
 
 #include <array>
@@ -28,27 +29,41 @@ void LookupDisplay::take(std::size_t index, const LogRecord& packet, const Dicti
                          Dictionary& state) {
     Code& code = _codes[index];
     if (!code.isReadLate) {
-        return read(code, packet, lookup, &state);
+        return readNow(code, packet, lookup, state);
+    }
+    if (_sink != nullptr) {
+        LayoutReader(*_sink, _memory, code.firstRow).read(*code.layout, packet);
     }
     code.packet.assign(packet.bytes().begin(), packet.bytes().end());
     code.lookup = lookup;
 }
 
+void LookupDisplay::readNow(const Code& code, const LogRecord& packet, const DictionaryRef& lookup,
+                            Dictionary& state) {
+    usePlacesOf(lookup);
+    _memory.state = &state;
+    if (_sink == nullptr) {
+        LayoutReader(*this, _memory, code.firstRow).read(*code.layout, packet);
+    } else {
+        DisplayAndSink both(*this, *_sink);
+        LayoutReader<SampleSink>(both, _memory, code.firstRow).read(*code.layout, packet);
+    }
+    _memory.state = nullptr;
+}
+
 void LookupDisplay::bringUpToDate() {
     for (Code& code : _codes) {
         if (const DictionaryRef lookup = std::exchange(code.lookup, nullptr)) {
-            read(code, LogRecord(code.packet), lookup, nullptr);
+            usePlacesOf(lookup);
+            LayoutReader(*this, _memory, code.firstRow).read(*code.layout, LogRecord(code.packet));
         }
     }
 }
 
-void LookupDisplay::read(const Code& code, const LogRecord& packet, const DictionaryRef& lookup,
-                         Dictionary* state) {
+void LookupDisplay::usePlacesOf(const DictionaryRef& lookup) {
     if (lookup != _lookup) {
         findPlaces(lookup);
     }
-    _memory.state = state;
-    LayoutReader(*this, _memory, code.firstRow).read(*code.layout, packet);
 }
 
 void LookupDisplay::findPlaces(const DictionaryRef& lookup) {

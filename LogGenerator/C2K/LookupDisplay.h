@@ -24,6 +24,10 @@ public:
     /// The layouts live as long as the program.
     explicit LookupDisplay(std::span<const CodeLayout* const> codes);
 
+    /// Gives the samples of later packets to `sink`, too, each when it arrives. Null: to the
+    /// display alone. The sink outlives the display, or is taken away.
+    void setSink(SampleSink* sink) { _sink = sink; }
+
     /// Takes an accepted packet of the code that is the `index`th. Without a lookup table (null) no
     /// value has a place.
     void take(std::size_t index, const LogRecord& packet, const DictionaryRef& lookup,
@@ -48,12 +52,14 @@ private:
         ByteBuffer packet = {};
     };
 
-    void read(const Code& code, const LogRecord& packet, const DictionaryRef& lookup,
-              Dictionary* state);
+    void readNow(const Code& code, const LogRecord& packet, const DictionaryRef& lookup,
+                 Dictionary& state);
+    void usePlacesOf(const DictionaryRef& lookup);
     void findPlaces(const DictionaryRef& lookup);
 
     std::vector<Code> _codes;
     RecordMemory _memory;
+    SampleSink* _sink = nullptr;
     /// The table that the places are of. Looking each value up in it took a quarter of the time of
     /// decoding a CDMA drive.
     DictionaryRef _lookup;

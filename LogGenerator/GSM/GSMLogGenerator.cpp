@@ -93,6 +93,9 @@ void GSMLogGenerator::updateState(Dictionary& state, Bytes data) {
     state.setFixed("DisplayState", *object);
     state.setFixed("Display", displayToCome(*object));
     state.setFixed("ExtraInfo", Dictionary());
+    if (_sink != nullptr) {
+        _samples.give(*object, *_sink);
+    }
 }
 
 PropertyList GSMLogGenerator::displayToCome(const PropertyList& object) {

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/GSM/ObjectSamples.h"
 #include "LogGenerator/LogGenerator.h"
 #include "text/Text.h"
 
@@ -43,6 +44,7 @@ public:
     /// included, and for a value of another type than the three anywhere in it.
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
+    void setSampleSink(SampleSink* sink) override { _sink = sink; }
     /// Every message is the whole display.
     bool keepsDisplay(const Dictionary& /*state*/) const override { return false; }
     PropertyList getStartCommand() const override;
@@ -67,6 +69,8 @@ private:
 
     DictionaryRef _unshown; // the object whose display is still to be made, or null
     DictionaryRef _display; // that display, empty until then; it is in the state
+    SampleSink* _sink = nullptr;
+    ObjectSamples _samples;
 };
 
 } // namespace pallax

@@ -1,5 +1,6 @@
 #include "LogGenerator/Records/LayoutRecord.h"
 
+#include "LogGenerator/Records/DisplayAndSink.h"
 #include "platform/SystemLog.h"
 
 #include <algorithm>
@@ -7,47 +8,6 @@
 namespace pallax {
 
 namespace {
-
-/// One pass for both, over a record that must be read once. What is kept from the display goes to
-/// the other sink alone.
-class DisplayAndSink final : public SampleSink {
-public:
-    DisplayAndSink(SectionDisplay& display, SampleSink& sink) : _display(display), _sink(sink) {}
-
-    void sample(const Sample& sample) override {
-        each([&](SampleSink& to) { to.sample(sample); });
-    }
-    void keyRemoved(std::string_view key) override {
-        each([&](SampleSink& to) { to.keyRemoved(key); });
-    }
-    void beginList(const SampleList& list) override {
-        _isHidden = list.layout != nullptr && !list.layout->isShown;
-        each([&](SampleSink& to) { to.beginList(list); });
-    }
-    void endList() override {
-        each([](SampleSink& to) { to.endList(); });
-        _isHidden = false;
-    }
-    void beginEntry(std::size_t index, std::int64_t name) override {
-        each([&](SampleSink& to) { to.beginEntry(index, name); });
-    }
-    void endEntry() override {
-        each([](SampleSink& to) { to.endEntry(); });
-    }
-
-private:
-    template <class Give>
-    void each(const Give& give) {
-        if (!_isHidden) {
-            give(_display);
-        }
-        give(_sink);
-    }
-
-    SectionDisplay& _display;
-    SampleSink& _sink;
-    bool _isHidden = false;
-};
 
 bool isPlain(const CodeLayout& code) {
     return code.accepts == nullptr && code.logs == nullptr && !code.exactLength &&
@@ -110,6 +70,9 @@ void LayoutRecord::updateWithData(const LogRecord& record, LogCode logCode) {
     const CodeLayout& layout = *code->layout;
     if (code->isPlain ? !record.has(code->minimumLength) : !accepts(layout, record)) {
         return;
+    }
+    if (_sink != nullptr) {
+        _sink->beginSection(_layout.section);
     }
     if (!code->isReadLate) {
         return readNow(*code, record);

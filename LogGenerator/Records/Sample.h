@@ -12,23 +12,23 @@
 namespace pallax {
 
 /// The number of a row in a technology's registry of fields: the rows of its layouts, in the order
-/// of their registration.
+/// of their registration. An object stream numbers its paths in the order of their arrival.
 using FieldId = std::uint32_t;
 
 /// One field read from one packet. Valid while the sink looks at it.
 struct Sample {
     FieldId id;
     const Field& field;
-    /// The number behind the value; nothing for a value of a property list that is no number, and
-    /// for one that is computed.
+    /// The number behind the value; nothing for a value of a property list that is no number, for
+    /// one that is computed, and for a text of an object stream.
     std::optional<std::int64_t> raw;
     const SampleValue& value;
 };
 
 /// The packet that samples come from.
 struct SamplePacket {
-    std::uint64_t number; ///< in its source, from 1
-    Time time;
+    std::uint64_t number = 0; ///< in its source, from 1; 0: not known
+    Time time = {};
 };
 
 /// A list that a packet replaces. `layout` is null for one that a property list tells of.
@@ -49,6 +49,7 @@ public:
     virtual ~SampleSink() = default;
     virtual void beginPacket(const SamplePacket& /*packet*/) {}
     virtual void endPacket() {}
+    /// What follows belongs to that section. Technologies without sections do not call it.
     virtual void beginSection(std::string_view /*section*/) {}
 
     virtual void sample(const Sample& sample) = 0;

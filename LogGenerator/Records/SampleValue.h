@@ -8,6 +8,13 @@
 
 namespace pallax {
 
+/// A text that is a number, or a number and its unit: "62", "-96.0 dBm".
+struct NumberText {
+    std::string_view text;
+    double number;
+    std::string_view unit; ///< part of the text; empty without one
+};
+
 /// What a field shows: a number with its format, a label of a table, a text, or an object of a
 /// property list. Texts and objects that are not from a table are valid until the sample is taken.
 class SampleValue {
@@ -17,6 +24,7 @@ public:
     static SampleValue label(std::string_view text) { return SampleValue(Value(Label{text})); }
     /// A text that is made for this sample.
     static SampleValue text(std::string_view text) { return SampleValue(Value(text)); }
+    static SampleValue text(const NumberText& text) { return SampleValue(Value(&text)); }
     static SampleValue object(const PropertyList& object) { return SampleValue(Value(&object)); }
 
     /// Null for everything else, as are those below.
@@ -25,10 +33,18 @@ public:
         const auto* object = std::get_if<const PropertyList*>(&_value);
         return object != nullptr ? *object : nullptr;
     }
+    /// The number in a text, where one was read from it.
+    const NumberText* numberText() const {
+        const auto* text = std::get_if<const NumberText*>(&_value);
+        return text != nullptr ? *text : nullptr;
+    }
     /// The text of a label or text; empty for everything else.
     std::string_view words() const {
         if (const auto* label = std::get_if<Label>(&_value)) {
             return label->text;
+        }
+        if (const NumberText* read = numberText()) {
+            return read->text;
         }
         const auto* text = std::get_if<std::string_view>(&_value);
         return text != nullptr ? *text : std::string_view();
@@ -51,7 +67,8 @@ private:
     struct Label {
         std::string_view text;
     };
-    using Value = std::variant<DisplayNumber, Label, std::string_view, const PropertyList*>;
+    using Value = std::variant<DisplayNumber, Label, std::string_view, const NumberText*,
+                               const PropertyList*>;
     explicit SampleValue(Value value) : _value(value) {}
 
     Value _value;

@@ -1,0 +1,146 @@
+#include "LogGenerator/GSM/ObjectSamples.h"
+
+#include <algorithm>
+#include <charconv>
+#include <optional>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::string_view kAnyEntry = "*";
+
+bool isDigit(char character) {
+    return character >= '0' && character <= '9';
+}
+
+/// Of what follows a number: one word behind a blank, or a per cent sign. Nothing for other words.
+std::optional<std::string_view> unitIn(std::string_view rest) {
+    if (rest.empty() || rest == "%") {
+        return rest;
+    }
+    if (rest.size() < 2 || rest.front() != ' ' || isDigit(rest[1]) ||
+        rest.find_first_of(" +-,;:()", 1) != std::string_view::npos) {
+        return std::nullopt;
+    }
+    return rest.substr(1);
+}
+
+/// The number in a text that is one, with its unit if it has one.
+std::optional<NumberText> numberIn(std::string_view text) {
+    const std::size_t sign = !text.empty() && (text[0] == '-' || text[0] == '+') ? 1 : 0;
+    if (text.size() == sign || !isDigit(text[sign])) {
+        return std::nullopt; // from_chars also takes "inf" and "nan"
+    }
+    const char* const start = text.data() + sign;
+    const char* const end = text.data() + text.size();
+    double number = 0.0;
+    const auto read = std::from_chars(start, end, number, std::chars_format::fixed);
+    if (read.ec != std::errc()) {
+        return std::nullopt;
+    }
+    const auto unit = unitIn({read.ptr, static_cast<std::size_t>(end - read.ptr)});
+    if (!unit) {
+        return std::nullopt;
+    }
+    return NumberText{text, text[0] == '-' ? -number : number, *unit};
+}
+
+} // namespace
+
+void ObjectSamples::give(const PropertyList& object, SampleSink& sink) {
+    const std::vector<FieldId> before = std::exchange(_shown, {});
+    _shown.reserve(before.size());
+    _sink = &sink;
+    _lists = 0;
+    _path.clear();
+    walk(object);
+    if (_shown != before) {
+        removeOthers(before);
+    }
+}
+
+void ObjectSamples::walk(const PropertyList& object) {
+    if (const Text* text = object.text()) {
+        giveText(text->view());
+    } else if (const DictionaryRef entries = object.dictionary()) {
+        for (const Dictionary::Entry& entry : *entries) {
+            walkCollapsed(entry.value, entry.key.view());
+        }
+    } else if (const ArrayRef elements = object.array()) {
+        giveList(*elements);
+    }
+}
+
+/// As the display shows it: a dictionary of one entry gives way to that entry's value.
+void ObjectSamples::walkCollapsed(const PropertyList& object, std::string_view name) {
+    const std::size_t length = _path.size();
+    _path += '/';
+    _path += name;
+    const PropertyList* shown = &object;
+    for (DictionaryRef only = shown->dictionary(); only != nullptr && only->size() == 1;
+         only = shown->dictionary()) {
+        shown = &only->begin()->value; // `object` keeps it
+    }
+    walk(*shown);
+    _path.resize(length);
+}
+
+void ObjectSamples::giveText(std::string_view text) {
+    const FieldId id = take();
+    if (id == kNoField) {
+        return;
+    }
+    const auto number = numberIn(text);
+    _sink->sample({id, _fields[id], std::nullopt,
+                   number ? SampleValue::text(*number) : SampleValue::text(text)});
+}
+
+void ObjectSamples::giveList(const Array& elements) {
+    const FieldId id = take();
+    if (id == kNoField) {
+        return;
+    }
+    constexpr std::size_t kLeftOut = 1; // the display leaves the first element out
+    const std::size_t count = elements.size() - std::min(kLeftOut, elements.size());
+    _sink->beginList({_fields[id].key, nullptr, count});
+    ++_lists;
+    for (std::size_t index = 0; index < count; ++index) {
+        _sink->beginEntry(index, 0);
+        walkCollapsed(elements[index + kLeftOut], kAnyEntry);
+        _sink->endEntry();
+    }
+    --_lists;
+    _sink->endList();
+}
+
+FieldId ObjectSamples::take() {
+    auto found = _ids.find(std::string_view(_path));
+    if (found == _ids.end()) {
+        if (_fields.size() == kMostPaths) {
+            return kNoField;
+        }
+        found = _ids.emplace(_path, static_cast<FieldId>(_fields.size())).first;
+        _fields.emplace_back().key = found->first;
+    }
+    if (_lists == 0) {
+        _shown.push_back(found->second);
+    }
+    return found->second;
+}
+
+void ObjectSamples::removeOthers(const std::vector<FieldId>& before) {
+    std::vector<bool> isShown(_fields.size());
+    for (const FieldId id : _shown) {
+        isShown[id] = true;
+    }
+    for (const FieldId id : before) {
+        if (!isShown[id]) {
+            _sink->keyRemoved(_fields[id].key);
+            isShown[id] = true; // two entries may have the same path
+        }
+    }
+}
+
+} // namespace pallax
