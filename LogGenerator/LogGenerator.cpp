@@ -44,6 +44,15 @@ PropertyList LogGenerator::display(const Dictionary& state) {
     return display != nullptr ? *display : PropertyList();
 }
 
+SectionAges LogGenerator::sectionAges(const Dictionary& state) {
+    bringDisplayUpToDate();
+    return agesIn(state);
+}
+
+SectionAges LogGenerator::agesIn(const Dictionary& /*state*/) const {
+    return {};
+}
+
 bool LogGenerator::keepsDisplay(const Dictionary& state) const {
     return state.find("Display") != nullptr;
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/SectionAges.h"
 #include "plist/PropertyList.h"
 #include "text/Bytes.h"
 
@@ -14,7 +15,6 @@ class Clock;
 class LogGenerator;
 class Resources;
 class SampleSink;
-class SectionAges;
 class StandardOutput;
 
 /// What a generator needs of its surroundings. All of it outlives the generator.
@@ -60,9 +60,8 @@ public:
     /// Gives the samples of later packets to `sink`, too, until it is null. The caller begins and
     /// ends the packets. The sink outlives the generator, or is taken away.
     virtual void setSampleSink(SampleSink* /*sink*/) {}
-    /// When the display's values were last read, for a generator that knows it; else null. Valid as
-    /// long as the generator.
-    virtual const SectionAges* sectionAges() const { return nullptr; }
+    /// When the values of the display, with every packet that has arrived, were last read.
+    SectionAges sectionAges(const Dictionary& state);
     /// True when this generator cannot update the display that an earlier one left in the state.
     virtual bool keepsDisplay(const Dictionary& state) const;
     /// The property-list dictionary that starts the modem's stream.
@@ -86,6 +85,9 @@ protected:
     /// Brings the live display in the state up to the latest packet: a generator may read a packet
     /// as late as that.
     virtual void bringDisplayUpToDate() {}
+    /// The ages in the live display of the state, which is up to date. Nothing is known of them
+    /// unless it is overridden.
+    virtual SectionAges agesIn(const Dictionary& state) const;
 
     /// Marks a generator whose parts are missing: its making is not logged, and what its class
     /// builds up is left out.

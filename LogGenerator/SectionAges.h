@@ -2,7 +2,9 @@
 
 #include "text/Date.h"
 
+#include <map>
 #include <optional>
+#include <string>
 #include <string_view>
 
 namespace pallax {
@@ -11,11 +13,22 @@ namespace pallax {
 /// values or not.
 class SectionAges {
 public:
-    virtual ~SectionAges() = default;
-    /// The packet time of the latest reading of what stands at `path` of the display tree ("/" the
-    /// root, "/Serving Cell", "/Serving Cell/ARFCN"). Nothing where no packet has been read, where
-    /// that is not known, and where the answer for the branch above holds.
-    virtual std::optional<Time> lastRead(std::string_view path) const = 0;
+    /// What stands at `path` of the display ("/" the root, "/Serving Cell", "/Serving Cell/ARFCN")
+    /// was read then.
+    void note(const std::string& path, Time read) {
+        Time& noted = _read.try_emplace(path, read).first->second;
+        noted = noted < read ? read : noted;
+    }
+
+    /// The packet time of the latest reading of what stands at `path`. Nothing where no packet has
+    /// been read, where that is not known, and where the answer for the branch above holds.
+    std::optional<Time> lastRead(std::string_view path) const {
+        const auto found = _read.find(path);
+        return found != _read.end() ? std::optional(found->second) : std::nullopt;
+    }
+
+private:
+    std::map<std::string, Time, std::less<>> _read;
 };
 
 } // namespace pallax

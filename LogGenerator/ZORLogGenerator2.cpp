@@ -1,6 +1,7 @@
 #include "LogGenerator/ZORLogGenerator2.h"
 
 #include "LogGenerator/LogPacket.h"
+#include "platform/Clock.h"
 #include "platform/Resources.h"
 #include "platform/SystemLog.h"
 
@@ -16,6 +17,30 @@ const GeneratorEnvironment& announced(const GeneratorEnvironment& environment,
     systemLog(LogPriority::Error, "Creating ZORLogGenerator2 object with %p",
               static_cast<const void*>(index));
     return environment;
+}
+
+/// Of the sections below a branch of the display, whose path it is.
+void noteAges(const Dictionary& branch, const std::string& path, const ClassIndex& index,
+              SectionAges& ages) {
+    for (const Dictionary::Entry& entry : branch) {
+        const std::string here = path + "/" + entry.key.string();
+        const DictionaryRef below = entry.value.dictionary();
+        const ClassIndex::Numbered* owner = index.recordOf(entry.key.view());
+        if (owner == nullptr || !owner->record->display().shows(entry.value)) {
+            if (below != nullptr) {
+                noteAges(*below, here, index, ages);
+            }
+            continue;
+        }
+        if (const auto read = owner->record->lastRead()) {
+            ages.note(here, *read);
+        }
+        for (const Dictionary::Entry& shown : below != nullptr ? *below : Dictionary()) {
+            if (const auto read = owner->record->lastRead(shown.key.view())) {
+                ages.note(here + "/" + shown.key.string(), *read);
+            }
+        }
+    }
 }
 
 std::int32_t codeOf(const std::string& decimal) {
@@ -68,6 +93,7 @@ void ZORLogGenerator2::updateWithData(Bytes data) {
     if (subscribers == nullptr) {
         return;
     }
+    cIndex->setPacketTime(environment().clock.now());
     for (Base* subscriber : *subscribers) {
         subscriber->updateWithData(record, code);
     }
@@ -174,6 +200,16 @@ void ZORLogGenerator2::bringDisplayUpToDate() {
     if (cIndex != nullptr) {
         cIndex->bringDisplayUpToDate();
     }
+}
+
+SectionAges ZORLogGenerator2::agesIn(const Dictionary& state) const {
+    SectionAges ages;
+    const PropertyList* display = state.find("Display");
+    const DictionaryRef root = display != nullptr ? display->dictionary() : nullptr;
+    if (cIndex != nullptr && root != nullptr) {
+        noteAges(*root, {}, *cIndex, ages);
+    }
+    return ages;
 }
 
 void ZORLogGenerator2::setSampleSink(SampleSink* sink) {

@@ -38,6 +38,7 @@ public:
 
 protected:
     void bringDisplayUpToDate() override;
+    SectionAges agesIn(const Dictionary& state) const override;
 
     /// What a technology supplies: the template's resource name and a new class index.
     struct Parts {

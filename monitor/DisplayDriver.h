@@ -57,8 +57,8 @@ public:
     /// The live display, with every packet that has arrived, or null when there is none yet.
     PropertyList display() { return _generator ? _generator->display(_state) : PropertyList(); }
     /// As LogGenerator tells it.
-    const SectionAges* sectionAges() const {
-        return _generator ? _generator->sectionAges() : nullptr;
+    SectionAges sectionAges() {
+        return _generator ? _generator->sectionAges(_state) : SectionAges();
     }
     /// What a snapshot saves. The sections of its displays are those of the live display.
     PropertyList saveContents() const {

@@ -11,6 +11,10 @@ PallaxModel::PallaxModel(const Platform& platform, ModelObserver& observer)
     : _queue(platform.queue), _clock(platform.generators.clock), _observer(observer),
       _link(platform, *this), _alive(std::make_shared<PallaxModel*>(this)) {}
 
+void PallaxModel::updateWithData(Bytes data) {
+    _driver.update(data, {.time = _clock.now()});
+}
+
 void PallaxModel::generatorChosen(const std::string& technology) {
     _observer.generatorChosen(technology, _driver.keepsDisplay());
 }
@@ -41,8 +45,9 @@ void PallaxModel::handOutFrame() {
     if (_frame && _frame->root() == root) { // two ticks before the queue got here
         return;
     }
+    const SectionAges ages = _driver.sectionAges();
     _frame = std::make_shared<Frame>(Frame::Picture{std::move(root), _nodesByPath, _clock.now()},
-                                     _frame.get(), _driver.sectionAges());
+                                     _frame.get(), &ages);
     // Copies, because an observer may add another or end the model.
     const FrameRef frame = _frame;
     const auto observers = _frameObservers;

@@ -50,7 +50,7 @@ public:
     bool isConnected() const { return _link.isConnected(); }
 
     /// One packet of the log channel. An exception of a record leaves through here.
-    void updateWithData(Bytes data) { _driver.update(data); }
+    void updateWithData(Bytes data);
     /// Looks after the link, and after new data drops the tree and tells the observer.
     void refresh() { _link.refresh(); }
 

@@ -4,6 +4,7 @@
 #include "text/ByteReader.h"
 #include "text/Utf8.h"
 
+#include <algorithm>
 #include <bit>
 #include <cmath>
 #include <limits>
@@ -318,15 +319,11 @@ const Text& BinaryReader::text(std::uint64_t offset, const Marker& marker) {
 }
 
 std::string BinaryReader::fromAscii(std::uint64_t offset, Bytes letters) {
-    std::string out;
-    out.reserve(letters.size());
-    for (const std::uint8_t letter : letters) {
-        if (letter > kLastAscii) {
-            refuse(offset, "an ASCII string with a byte beyond ASCII");
-        }
-        out += static_cast<char>(letter);
+    if (std::any_of(letters.begin(), letters.end(),
+                    [](std::uint8_t letter) { return letter > kLastAscii; })) {
+        refuse(offset, "an ASCII string with a byte beyond ASCII");
     }
-    return out;
+    return {letters.begin(), letters.end()};
 }
 
 std::string BinaryReader::fromUtf8(std::uint64_t offset, Bytes letters) {

@@ -11,6 +11,7 @@
 #include "LogGenerator/C2K/OneXTrafficErrors.h"
 #include "LogGenerator/C2K/ReverseDataRate.h"
 #include "LogGenerator/LogPacket.h"
+#include "platform/Clock.h"
 #include "platform/Resources.h"
 #include "platform/SystemLog.h"
 
@@ -39,6 +40,26 @@ constexpr std::string_view kSorted = "_sorted";
 DictionaryRef dictionaryUnder(std::string_view key, const Dictionary& state) {
     const PropertyList* found = state.find(key);
     return found != nullptr ? found->dictionary() : nullptr;
+}
+
+using PlaceRead = LookupDisplay::PlaceRead;
+
+/// Of the places below a branch of the display, whose path it is.
+void noteAges(const DictionaryRef& branch, const std::string& path,
+              const std::vector<PlaceRead>& places, SectionAges& ages) {
+    for (const Dictionary::Entry& entry : *branch) {
+        const std::string here = path + "/" + entry.key.string();
+        bool isPlace = false;
+        for (const PlaceRead& each : places) {
+            if (each.place.display == branch && each.place.key == entry.key) {
+                ages.note(here, each.time);
+                isPlace = true;
+            }
+        }
+        if (const DictionaryRef below = entry.value.dictionary(); below != nullptr && !isPlace) {
+            noteAges(below, here, places, ages);
+        }
+    }
 }
 
 } // namespace
@@ -128,6 +149,7 @@ void C2KLogGenerator::updateFromLog(Bytes packet, const DictionaryRef& lookup, D
         return;
     }
     if ((*code)->accepts(**code, record)) {
+        _display->setPacketTime(environment().clock.now());
         _display->take(static_cast<std::size_t>(code - kCodes.begin()), record, lookup, state);
     }
     capture(record.bytes());
@@ -135,6 +157,14 @@ void C2KLogGenerator::updateFromLog(Bytes packet, const DictionaryRef& lookup, D
 
 void C2KLogGenerator::bringDisplayUpToDate() {
     _display->bringUpToDate();
+}
+
+SectionAges C2KLogGenerator::agesIn(const Dictionary& state) const {
+    SectionAges ages;
+    if (const DictionaryRef display = dictionaryUnder("Display", state)) {
+        noteAges(display, {}, _display->placesRead(), ages);
+    }
+    return ages;
 }
 
 void C2KLogGenerator::setSampleSink(SampleSink* sink) {

@@ -49,6 +49,7 @@ public:
 
 protected:
     void bringDisplayUpToDate() override;
+    SectionAges agesIn(const Dictionary& state) const override;
 
 private:
     std::unique_ptr<LookupDisplay> _display;

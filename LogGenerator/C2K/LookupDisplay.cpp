@@ -23,6 +23,7 @@ LookupDisplay::LookupDisplay(std::span<const CodeLayout* const> codes) {
         row += static_cast<FieldId>(rowCount(*code));
     }
     _places.resize(row);
+    _times.setRows(0, row);
 }
 
 void LookupDisplay::take(std::size_t index, const LogRecord& packet, const DictionaryRef& lookup,
@@ -36,12 +37,14 @@ void LookupDisplay::take(std::size_t index, const LogRecord& packet, const Dicti
     }
     code.packet.assign(packet.bytes().begin(), packet.bytes().end());
     code.lookup = lookup;
+    code.time = _packetTime;
 }
 
 void LookupDisplay::readNow(const Code& code, const LogRecord& packet, const DictionaryRef& lookup,
                             Dictionary& state) {
     usePlacesOf(lookup);
     _memory.state = &state;
+    _times.setPacket(_packetTime);
     if (_sink == nullptr) {
         LayoutReader(*this, _memory, code.firstRow).read(*code.layout, packet);
     } else {
@@ -55,6 +58,7 @@ void LookupDisplay::bringUpToDate() {
     for (Code& code : _codes) {
         if (const DictionaryRef lookup = std::exchange(code.lookup, nullptr)) {
             usePlacesOf(lookup);
+            _times.setPacket(code.time);
             LayoutReader(*this, _memory, code.firstRow).read(*code.layout, LogRecord(code.packet));
         }
     }
@@ -86,6 +90,28 @@ void LookupDisplay::findPlaces(const DictionaryRef& lookup) {
     }
 }
 
+std::vector<LookupDisplay::PlaceRead> LookupDisplay::placesRead() const {
+    std::vector<PlaceRead> read;
+    const auto add = [&read](const std::vector<LookupPlace>& places, std::optional<Time> time) {
+        for (const LookupPlace& place : places) {
+            if (time) {
+                read.push_back({place, *time});
+            }
+        }
+    };
+    for (FieldId row = 0; row < _places.size(); ++row) {
+        add(_places[row], _times.ofRow(row));
+    }
+    for (const Code& code : _codes) {
+        for (const ListLayout& list : code.layout->lists) {
+            if (_lookup != nullptr) {
+                add(lookupPlaces(list.key, *_lookup), _times.ofKey(list.key));
+            }
+        }
+    }
+    return read;
+}
+
 void LookupDisplay::sample(const Sample& sample) {
     if (_pilots != nullptr) {
         PropertyList value;
@@ -93,6 +119,7 @@ void LookupDisplay::sample(const Sample& sample) {
         _pilots->set(std::exchange(_pilot, {}), std::move(value));
         return;
     }
+    _times.noteRow(sample.id);
     for (const LookupPlace& place : _places[sample.id]) {
         PropertyList value;
         sample.value.showIn(value);
@@ -124,6 +151,7 @@ void LookupDisplay::endList() {
                                    : PropertyList(pilots);
     if (_lookup != nullptr) {
         setLookupValue(_list->key, shown, *_lookup);
+        _times.noteKey(_list->key);
     }
 }
 

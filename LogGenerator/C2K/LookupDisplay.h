@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/C2K/C2KLookup.h"
+#include "LogGenerator/Records/ReadTimes.h"
 #include "LogGenerator/Records/Sample.h"
 #include "plist/PropertyList.h"
 
@@ -28,12 +29,21 @@ public:
     /// display alone. The sink outlives the display, or is taken away.
     void setSink(SampleSink* sink) { _sink = sink; }
 
+    /// Of the packet that is taken next.
+    void setPacketTime(Time time) { _packetTime = time; }
     /// Takes an accepted packet of the code that is the `index`th. Without a lookup table (null) no
     /// value has a place.
     void take(std::size_t index, const LogRecord& packet, const DictionaryRef& lookup,
               Dictionary& state);
     /// Reads the packets that are kept.
     void bringUpToDate();
+
+    /// When what is shown in a place was last read.
+    struct PlaceRead {
+        LookupPlace place;
+        Time time;
+    };
+    std::vector<PlaceRead> placesRead() const;
 
     void sample(const Sample& sample) override;
     void keyRemoved(std::string_view /*key*/) override {} // a value stays until the next
@@ -50,6 +60,7 @@ private:
         // The latest packet that waits, and the table for it; null: none.
         DictionaryRef lookup = nullptr;
         ByteBuffer packet = {};
+        Time time = {};
     };
 
     void readNow(const Code& code, const LogRecord& packet, const DictionaryRef& lookup,
@@ -60,6 +71,8 @@ private:
     std::vector<Code> _codes;
     RecordMemory _memory;
     SampleSink* _sink = nullptr;
+    Time _packetTime{};
+    ReadTimes _times;
     /// The table that the places are of. Looking each value up in it took a quarter of the time of
     /// decoding a CDMA drive.
     DictionaryRef _lookup;

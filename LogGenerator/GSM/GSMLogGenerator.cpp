@@ -1,5 +1,6 @@
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 
+#include "platform/Clock.h"
 #include "plist/PropertyListCodec.h"
 #include "text/Format.h"
 
@@ -93,6 +94,7 @@ void GSMLogGenerator::updateState(Dictionary& state, Bytes data) {
     state.setFixed("DisplayState", *object);
     state.setFixed("Display", displayToCome(*object));
     state.setFixed("ExtraInfo", Dictionary());
+    _read = environment().clock.now();
     if (_sink != nullptr) {
         _samples.give(*object, *_sink);
     }
@@ -112,6 +114,14 @@ void GSMLogGenerator::bringDisplayUpToDate() {
         *_display = displayForm(*_unshown);
         _unshown = nullptr;
     }
+}
+
+SectionAges GSMLogGenerator::agesIn(const Dictionary& /*state*/) const {
+    SectionAges ages;
+    if (_read) {
+        ages.note("/", *_read);
+    }
+    return ages;
 }
 
 PropertyList GSMLogGenerator::generateLogUsingState(Dictionary& state) {

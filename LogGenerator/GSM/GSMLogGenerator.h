@@ -5,6 +5,7 @@
 #include "text/Text.h"
 
 #include <memory>
+#include <optional>
 #include <stdexcept>
 #include <string>
 #include <string_view>
@@ -61,14 +62,16 @@ public:
 
 protected:
     void bringDisplayUpToDate() override;
+    SectionAges agesIn(const Dictionary& state) const override;
 
 private:
     /// The display of an object whose values are of the three types; that of a dictionary is empty
     /// until `bringDisplayUpToDate`, for mostly the next message comes before anybody looks.
     PropertyList displayToCome(const PropertyList& object);
 
-    DictionaryRef _unshown; // the object whose display is still to be made, or null
-    DictionaryRef _display; // that display, empty until then; it is in the state
+    DictionaryRef _unshown;    // the object whose display is still to be made, or null
+    DictionaryRef _display;    // that display, empty until then; it is in the state
+    std::optional<Time> _read; // when the latest message came
     SampleSink* _sink = nullptr;
     ObjectSamples _samples;
 };

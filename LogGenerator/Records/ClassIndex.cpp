@@ -31,6 +31,7 @@ std::vector<std::string> ClassIndex::getAllLogCodes() const {
 
 void ClassIndex::addRows(LayoutRecord& record) {
     record.display().setLate(true);
+    record.setPlace(_nextRow, _packetTime);
     _records.push_back({&record, _nextRow});
     for (const CodeLayout& code : record.layout().codes) {
         _nextRow += static_cast<FieldId>(rowCount(code));
@@ -47,7 +48,7 @@ const ClassIndex::Numbered* ClassIndex::recordOf(std::string_view sectionName) c
 
 void ClassIndex::setSink(SampleSink* sink) {
     for (const auto& [record, firstRow] : _records) {
-        record->setSink(sink, firstRow);
+        record->setSink(sink);
     }
 }
 

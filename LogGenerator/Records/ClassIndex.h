@@ -39,6 +39,8 @@ public:
     const std::vector<Numbered>& records() const { return _records; }
     /// The record of that section, or null.
     const Numbered* recordOf(std::string_view sectionName) const;
+    /// Of the packet whose records follow.
+    void setPacketTime(Time time) { _packetTime = time; }
     /// Gives the samples of all records to `sink`, too, until it is null. The sink outlives the
     /// index, or is taken away.
     void setSink(SampleSink* sink);
@@ -70,6 +72,7 @@ private:
     StandardOutput& _output;
     std::vector<Numbered> _records;
     FieldId _nextRow = 0;
+    Time _packetTime{};
 };
 
 } // namespace pallax

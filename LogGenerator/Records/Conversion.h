@@ -19,6 +19,7 @@ struct Conversion {
     double factor = 1.0;
     double divisor = 1.0; ///< for decimal fractions, which no factor is exactly
     double offset = 0.0;
+    bool isScaled = false; ///< by any of the three: said once, for it is asked of each number
 
     /// labels[raw + shift]; with a shift other than 0 the index is cut to 8 bits, so that the byte
     /// 255 finds the first entry at a shift of 1.
@@ -39,6 +40,7 @@ struct Conversion {
         result.format = &format;
         result.factor = factor;
         result.offset = offset;
+        result.isScaled = factor != 1.0 || offset != 0.0;
         return result;
     }
     static Conversion number(const NumberFormat&& format, double = 1.0, double = 0.0) = delete;
@@ -74,6 +76,7 @@ struct Conversion {
     constexpr Conversion dividedBy(double by) const {
         Conversion result = *this;
         result.divisor = by;
+        result.isScaled = result.isScaled || by != 1.0;
         return result;
     }
 
@@ -95,9 +98,11 @@ inline SampleValue Conversion::valueOf(std::int64_t raw) const {
         return SampleValue::label(exceptionalText);
     }
     if (format != nullptr) {
-        const bool plain = factor == 1.0 && divisor == 1.0 && offset == 0.0;
-        return plain ? DisplayNumber(raw, *format)
-                     : DisplayNumber(static_cast<double>(raw) * factor / divisor + offset, *format);
+        if (!isScaled) {
+            return DisplayNumber(raw, *format);
+        }
+        const double scaled = static_cast<double>(raw) * factor;
+        return DisplayNumber((divisor == 1.0 ? scaled : scaled / divisor) + offset, *format);
     }
     const auto index = static_cast<std::uint64_t>(raw) + shift;
     const std::size_t entry = shift == 0 ? index : static_cast<std::uint8_t>(index);

@@ -6,6 +6,7 @@
 #include "plist/PropertyList.h"
 #include "text/Format.h"
 
+#include <algorithm>
 #include <optional>
 #include <span>
 #include <string>
@@ -139,6 +140,7 @@ private:
         const EntryList companions =
             list.companion ? EntryList(place, list.companion->layoutIn(place), entries.count())
                            : EntryList({}, {}, 0);
+        const bool mayBeLonger = hasConditions(list);
         _sink.beginList({list.key, &list, whole});
         for (std::size_t index = 0; index < whole; ++index) {
             const LogRecord entry = entries.at(index);
@@ -151,7 +153,7 @@ private:
                 }
                 _place.companion = companions.at(index);
             }
-            if (!holdsItsFields(list, entry)) {
+            if (mayBeLonger && !holdsItsFields(list, entry)) {
                 break;
             }
             _place.around = place;
@@ -163,6 +165,10 @@ private:
         _sink.endList();
     }
 
+    static bool hasConditions(const ListLayout& list) {
+        return std::any_of(list.fields.begin(), list.fields.end(),
+                           [](const Field& field) { return field.condition != nullptr; });
+    }
     /// An entry may be longer where a condition holds.
     static bool holdsItsFields(const ListLayout& list, const LogRecord& entry) {
         for (const Field& field : list.fields) {

@@ -43,9 +43,34 @@ void LayoutRecord::updateSectionRef(PropertyList section) {
     _display.setSection(sectionRef());
 }
 
-void LayoutRecord::setSink(SampleSink* sink, FieldId first) {
-    _sink = sink;
+void LayoutRecord::setPlace(FieldId first, const Time& packet) {
     _firstRow = first;
+    _packet = &packet;
+    FieldId rows = 0;
+    for (const Code& code : _codes) {
+        rows += static_cast<FieldId>(rowCount(*code.layout));
+    }
+    _display.times().setRows(first, rows);
+}
+
+std::optional<Time> LayoutRecord::lastRead(std::string_view key) const {
+    const ReadTimes& times = _display.times();
+    std::optional<Time> latest = times.ofKey(key);
+    for (const Code& code : _codes) {
+        FieldId row = _firstRow + code.firstRow;
+        const auto look = [&](std::span<const Field> fields, std::span<const ListLayout> lists) {
+            for (const Field& field : fields) {
+                latest = std::max(latest, field.key == key ? times.ofRow(row) : std::nullopt);
+                ++row;
+            }
+            row += static_cast<FieldId>(rowCount(lists));
+        };
+        look(code.layout->fields, code.layout->lists);
+        for (const SubpacketLayout& subpacket : code.layout->subpackets) {
+            look(subpacket.fields, subpacket.lists);
+        }
+    }
+    return latest;
 }
 
 const LayoutRecord::Code* LayoutRecord::codeOf(LogCode logCode) const {
@@ -80,7 +105,9 @@ void LayoutRecord::updateWithData(const LogRecord& record, LogCode logCode) {
     if (_sink != nullptr) {
         LayoutReader(*_sink, _memory, _firstRow + code->firstRow).read(layout, record);
     }
-    _display.keep(layout, record, code->hasShapes ? shapeOf(layout, record) : 0);
+    _display.keep({&layout, _firstRow + code->firstRow,
+                   code->hasShapes ? shapeOf(layout, record) : 0, packetTime()},
+                  record);
 }
 
 bool LayoutRecord::accepts(const CodeLayout& layout, const LogRecord& record) {
@@ -98,6 +125,7 @@ bool LayoutRecord::accepts(const CodeLayout& layout, const LogRecord& record) {
 void LayoutRecord::readNow(const Code& code, const LogRecord& record) {
     const CodeLayout& layout = *code.layout;
     _display.bringUpToDate(); // with what is remembered until now
+    _display.times().setPacket(packetTime());
     remember(layout, record, _memory);
     const FieldId first = _firstRow + code.firstRow;
     if (_sink == nullptr) {

@@ -4,6 +4,8 @@
 #include "LogGenerator/Records/Layout.h"
 #include "LogGenerator/Records/SectionDisplay.h"
 
+#include <optional>
+#include <string_view>
 #include <vector>
 
 namespace pallax {
@@ -27,9 +29,16 @@ public:
     /// Shows the section.
     SectionDisplay& display() { return _display; }
 
-    /// Gives the samples of later records to `sink`, too; this record's rows are numbered from
-    /// `first` on. Null: to the display alone. The sink outlives the record, or is taken away.
-    void setSink(SampleSink* sink, FieldId first);
+    /// This record's rows are numbered from `first` on, and `packet` is the time of each packet
+    /// when it arrives; it outlives the record. Without them: from 0 on, and no time.
+    void setPlace(FieldId first, const Time& packet);
+    /// Gives the samples of later records to `sink`, too. Null: to the display alone. The sink
+    /// outlives the record, or is taken away.
+    void setSink(SampleSink* sink) { _sink = sink; }
+
+    /// When the section was last read, and what it shows under a key of its own.
+    std::optional<Time> lastRead() const { return _display.times().latest(); }
+    std::optional<Time> lastRead(std::string_view key) const;
 
 private:
     /// What is worked out once of a code's layout: most packets need no more.
@@ -44,6 +53,7 @@ private:
     };
 
     const Code* codeOf(LogCode logCode) const;
+    Time packetTime() const { return _packet != nullptr ? *_packet : Time(); }
     static bool accepts(const CodeLayout& layout, const LogRecord& record);
     void readNow(const Code& code, const LogRecord& record);
 
@@ -54,6 +64,7 @@ private:
     SectionDisplay _display;
     SampleSink* _sink = nullptr;
     FieldId _firstRow = 0;
+    const Time* _packet = nullptr;
 };
 
 } // namespace pallax

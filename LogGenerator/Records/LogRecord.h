@@ -3,8 +3,10 @@
 #include "plist/PropertyListCodec.h"
 #include "text/Bytes.h"
 
+#include <bit>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <optional>
 
 namespace pallax {
@@ -92,30 +94,35 @@ public:
 
     /// The number at `position`, sign-extended where that is signed.
     std::int64_t read(const Position& position) const {
-        const std::uint64_t mask = (std::uint64_t{1} << position.width) - 1;
-        const std::uint64_t raw = (gather(position) >> position.bit) & mask;
-        const std::uint64_t signBit = std::uint64_t{1} << (position.width - 1);
-        if (position.isSigned && (raw & signBit) != 0) {
-            return static_cast<std::int64_t>(raw) - static_cast<std::int64_t>(mask) - 1;
-        }
-        return static_cast<std::int64_t>(raw);
+        constexpr unsigned kBits = 64;
+        const unsigned above = kBits - position.width;
+        const std::uint64_t top = gather(position) << (above - position.bit);
+        return position.isSigned ? static_cast<std::int64_t>(top) >> above
+                                 : static_cast<std::int64_t>(top >> above);
     }
 
 private:
     static constexpr unsigned kByteBits = 8;
 
     /// The bytes that hold a position, in the order of their places; what lies above is of no use.
-    /// Where 8 bytes are there they are taken at once: of constant length, the loop is one load.
+    /// Where 8 bytes are there they are loaded at once.
     std::uint64_t gather(const Position& position) const {
-        std::uint64_t value = 0;
-        if (position.bigEndian || !has(position.byte + sizeof(value))) {
+        if (std::endian::native != std::endian::little || position.bigEndian) {
             return gatherEach(position);
         }
-        for (unsigned index = 0; index < sizeof(value); ++index) {
-            value |= std::uint64_t{_bytes[position.byte + index]} << (index * kByteBits);
-        }
-        return value;
+        return has(position.byte + sizeof(std::uint64_t)) ? load<std::uint64_t>(position.byte)
+                                                          : gatherLast(position.byte);
     }
+    /// Of a machine that is little-endian, too. The bytes are there.
+    template <class Number>
+    std::uint64_t load(std::size_t at) const {
+        Number number = 0;
+        std::memcpy(&number, _bytes.data() + at, sizeof(number));
+        return number;
+    }
+    /// The fewer than 8 bytes from there to the end.
+    std::uint64_t gatherLast(std::size_t at) const;
+    /// For the other order of bytes.
     std::uint64_t gatherEach(const Position& position) const;
 
     Bytes _bytes;

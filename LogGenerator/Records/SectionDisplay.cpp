@@ -12,21 +12,26 @@ void SectionDisplay::setSection(const PropertyList& section) {
     _list = section.array();
 }
 
-void SectionDisplay::keep(const CodeLayout& code, const LogRecord& record, unsigned shape) {
-    if (!_isLate) {
-        return LayoutReader(*this, _memory, 0).read(code, record);
-    }
-    if (_keptCode != &code || _keptShape != shape) {
+bool SectionDisplay::shows(const PropertyList& value) const {
+    return _keys != nullptr ? value.dictionary() == _keys
+                            : _list != nullptr && value.array() == _list;
+}
+
+void SectionDisplay::keep(const Reading& reading, const LogRecord& record) {
+    if (_reading.code != reading.code || _reading.shape != reading.shape) {
         bringUpToDate();
     }
     _kept.assign(record.bytes().begin(), record.bytes().end());
-    _keptCode = &code;
-    _keptShape = shape;
+    _reading = reading;
+    if (!_isLate) {
+        bringUpToDate();
+    }
 }
 
 void SectionDisplay::bringUpToDate() {
-    if (const CodeLayout* code = std::exchange(_keptCode, nullptr)) {
-        LayoutReader(*this, _memory, 0).read(*code, LogRecord(_kept));
+    if (const CodeLayout* code = std::exchange(_reading.code, nullptr)) {
+        _times.setPacket(_reading.packet);
+        LayoutReader(*this, _memory, _reading.firstRow).read(*code, LogRecord(_kept));
     }
 }
 
@@ -34,6 +39,7 @@ void SectionDisplay::sample(const Sample& sample) {
     if (_open.empty()) {
         if (_keys != nullptr) {
             sample.value.showIn(_keys->valueToSet(sample.field.key));
+            _times.noteRow(sample.id);
         }
         return;
     }
@@ -49,6 +55,7 @@ void SectionDisplay::sample(const Sample& sample) {
 void SectionDisplay::keyRemoved(std::string_view key) {
     if (_keys != nullptr) {
         (void)_keys->remove(key);
+        _times.noteKey(key);
     }
 }
 
@@ -72,9 +79,11 @@ void SectionDisplay::endList() {
     } else if (!ended.key.empty()) {
         if (_keys != nullptr) {
             _keys->setFixed(ended.key, std::move(ended.list));
+            _times.noteKey(ended.key);
         }
     } else if (_list != nullptr) {
         Base::replaceArray(*_list, std::move(ended.list));
+        _times.noteKey({});
     }
 }
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/LayoutReader.h"
+#include "LogGenerator/Records/ReadTimes.h"
 #include "LogGenerator/Records/Sample.h"
 
 #include <cstddef>
@@ -26,11 +27,23 @@ public:
 
     /// Whether records may wait until the display is brought up to date; not, unless it is set.
     void setLate(bool isLate) { _isLate = isLate; }
-    /// Keeps an accepted record that may be read late, in place of the one before. `shape` is its
-    /// `shapeOf`, or 0 where the code has no shapes.
-    void keep(const CodeLayout& code, const LogRecord& record, unsigned shape);
+    /// How a record is read. Null code: none.
+    struct Reading {
+        const CodeLayout* code = nullptr;
+        FieldId firstRow = 0;
+        unsigned shape = 0; ///< its `shapeOf`, or 0 where the code has no shapes
+        Time packet = {};
+    };
+    /// Keeps an accepted record that may be read late, in place of the one before.
+    void keep(const Reading& reading, const LogRecord& record);
     /// Reads the record that is kept.
     void bringUpToDate();
+
+    /// Whether it is the section.
+    bool shows(const PropertyList& value) const;
+    /// Of what the section shows.
+    ReadTimes& times() { return _times; }
+    const ReadTimes& times() const { return _times; }
 
     void sample(const Sample& sample) override;
     void keyRemoved(std::string_view key) override;
@@ -59,9 +72,10 @@ private:
     std::vector<Open> _open;
     Array _spares;
 
+    ReadTimes _times;
+
     bool _isLate = false;
-    const CodeLayout* _keptCode = nullptr;
-    unsigned _keptShape = 0;
+    Reading _reading; ///< of the record that is kept
     ByteBuffer _kept;
 };
 

@@ -19,16 +19,6 @@ using Paths = std::vector<std::string>;
 
 constexpr Time kFirstTick{seconds(1700000000)};
 
-class KnownAges final : public SectionAges {
-public:
-    std::map<std::string, Time, std::less<>> times;
-
-    std::optional<Time> lastRead(std::string_view path) const override {
-        const auto found = times.find(path);
-        return found != times.end() ? std::optional(found->second) : std::nullopt;
-    }
-};
-
 class FrameTest : public testing::Test {
 protected:
     static Frame::Picture pictureOf(const PropertyList& display, Time time) {
@@ -52,7 +42,7 @@ protected:
         return std::chrono::duration_cast<seconds>(frame->age(*frame->nodeAtPath(path))).count();
     }
 
-    KnownAges ages;
+    SectionAges ages;
     bool hasAges = false;
     FrameRef frame;
 };
@@ -166,14 +156,15 @@ TEST_F(FrameTest, WithoutADisplayThereIsAnEmptyFrame) {
 
 TEST_F(FrameTest, AValueIsAsOldAsItsLatestReading) {
     hasAges = true;
-    ages.times = {{"/A", kFirstTick + seconds(1)}};
+    ages.note("/A", kFirstTick + seconds(1));
     show(Dictionary{{"A", Dictionary{{"B", "1"}}}, {"C", Dictionary{{"D", "2"}}}}, 2);
     EXPECT_EQ(age("/A/B"), 1) << "as the section";
     EXPECT_EQ(age("/A"), 1);
     EXPECT_EQ(age("/"), 1) << "as the latest below";
     EXPECT_EQ(stamp("/C/D").read, std::nullopt);
     EXPECT_EQ(age("/C/D"), 0) << "since it changed";
-    ages.times = {{"/A", kFirstTick + seconds(9)}, {"/A/B", kFirstTick + seconds(4)}};
+    ages.note("/A", kFirstTick + seconds(9));
+    ages.note("/A/B", kFirstTick + seconds(4));
     show(Dictionary{{"A", Dictionary{{"B", "1"}}}, {"C", Dictionary{{"D", "2"}}}}, 10);
     EXPECT_EQ(frame->changed(), Paths{});
     EXPECT_EQ(age("/A/B"), 6) << "an answer of its own";
@@ -184,9 +175,9 @@ TEST_F(FrameTest, AValueIsAsOldAsItsLatestReading) {
 
 TEST_F(FrameTest, AFrameKeepsTheAgesThatItWasMadeWith) {
     hasAges = true;
-    ages.times = {{"/", kFirstTick}};
+    ages.note("/", kFirstTick);
     show(Dictionary{{"A", "1"}}, 3);
-    ages.times.clear();
+    ages = {};
     EXPECT_EQ(age("/A"), 3);
 }
 

@@ -1,4 +1,3 @@
-#include "LogGenerator/SectionAges.h"
 #include "tests/doubles/ModelFixture.h"
 
 namespace pallax {
@@ -22,15 +21,16 @@ public:
 };
 
 /// A generator that knows when all that it shows was read.
-class AgingGenerator final : public FakeGenerator, private SectionAges {
+class AgingGenerator final : public FakeGenerator {
 public:
     using FakeGenerator::FakeGenerator;
     static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment) {
         return std::make_unique<AgingGenerator>(environment);
     }
-    const SectionAges* sectionAges() const override { return this; }
-    std::optional<Time> lastRead(std::string_view path) const override {
-        return path == "/" ? std::optional(readAt) : std::nullopt;
+    SectionAges agesIn(const Dictionary& /*state*/) const override {
+        SectionAges ages;
+        ages.note("/", readAt);
+        return ages;
     }
 
     Time readAt;

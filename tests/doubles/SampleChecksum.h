@@ -1,0 +1,76 @@
+#pragma once
+
+#include "LogGenerator/Records/Sample.h"
+
+#include <array>
+#include <bit>
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <string_view>
+
+namespace pallax::doubles {
+
+/// A checksum of samples: over field, entry, raw number and value of each, in their order, and over
+/// the lists that begin and the keys that are removed. The same on every machine.
+class SampleChecksum {
+public:
+    /// `value`: what one of the functions below makes of it.
+    void sample(FieldId field, std::optional<std::int64_t> raw, std::uint64_t value) {
+        add(field * kFactors[0] + (raw ? static_cast<std::uint64_t>(*raw) : kNoRaw) * kFactors[1] +
+            value * kFactors[2]);
+    }
+    void entry(std::size_t index, std::int64_t name) {
+        add(index * kFactors[0] + static_cast<std::uint64_t>(name) * kFactors[1]);
+    }
+    /// Of a list that begins, or of what is removed.
+    void key(std::string_view key) { add(of(key)); }
+
+    static std::uint64_t of(const DisplayNumber& number) {
+        return number.isReal() ? of(number.real()) : static_cast<std::uint64_t>(number.integer());
+    }
+    static std::uint64_t of(double number) { return std::bit_cast<std::uint64_t>(number); }
+    static std::uint64_t of(std::string_view text) {
+        constexpr std::size_t kWord = sizeof(std::uint64_t);
+        std::uint64_t sum = text.size();
+        for (; text.size() >= kWord; text.remove_prefix(kWord)) {
+            sum = mixed(sum, word(text, kWord));
+        }
+        return mixed(sum, word(text, text.size()));
+    }
+    static std::uint64_t of(std::string_view text, double number) {
+        return mixed(of(text), of(number));
+    }
+
+    std::uint64_t sum() const { return _sum; }
+
+private:
+    static constexpr std::uint64_t kNoRaw = 0x5555'5555'5555'5555;
+
+    /// Odd, with bits everywhere.
+    static constexpr std::array<std::uint64_t, 3> kFactors = {
+        0x9E37'79B9'7F4A'7C15, 0xC2B2'AE3D'27D4'EB4F, 0x1656'67B1'9E37'79F9};
+
+    static std::uint64_t mixed(std::uint64_t sum, std::uint64_t number) {
+        constexpr int kTurn = 29;
+        return std::rotl((sum ^ number) * kFactors[0], kTurn);
+    }
+    static std::uint64_t word(std::string_view text, std::size_t bytes) {
+        constexpr unsigned kByteBits = 8;
+        std::uint64_t word = 0;
+        for (std::size_t index = 0; index < bytes; ++index) {
+            word |= std::uint64_t{static_cast<unsigned char>(text[index])} << (index * kByteBits);
+        }
+        return word;
+    }
+    /// Only the turn and the sum wait for the sample before.
+    void add(std::uint64_t number) {
+        constexpr unsigned kHalf = 32;
+        constexpr int kTurn = 13;
+        _sum = std::rotl(_sum, kTurn) + (number ^ (number >> kHalf)) * kFactors[0];
+    }
+
+    std::uint64_t _sum = 1;
+};
+
+} // namespace pallax::doubles
