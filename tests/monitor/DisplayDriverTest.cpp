@@ -5,6 +5,7 @@
 #include "tests/doubles/FakeResources.h"
 #include "tests/doubles/FakeStandardOutput.h"
 #include "tests/doubles/ManualClock.h"
+#include "tests/doubles/SampleRecorder.h"
 
 #include <gtest/gtest.h>
 
@@ -93,6 +94,66 @@ TEST_F(DisplayDriverTest, TheStateOutlivesTheGenerator) {
     EXPECT_TRUE(driver.keepsDisplay());
     EXPECT_EQ(driver.display(), PropertyList("shown"));
     EXPECT_EQ(driver.saveContents(), PropertyList(Array{Dictionary{{"Display", "shown"}}}));
+}
+
+/// Knows its sink.
+class SampledGenerator final : public FakeGenerator {
+public:
+    using FakeGenerator::FakeGenerator;
+    void setSampleSink(SampleSink* sink) override { samples = sink; }
+    void updateState(Dictionary& state, Bytes data) override {
+        if (samples != nullptr) {
+            samples->keyRemoved("in the packet");
+        }
+        FakeGenerator::updateState(state, data);
+    }
+
+    SampleSink* samples = nullptr;
+};
+
+class SampledDriverTest : public DisplayDriverTest {
+protected:
+    SampledGenerator& setSampledGenerator() {
+        driver.setGenerator(std::make_unique<SampledGenerator>(
+            GeneratorEnvironment{clock, resources, bundle, output}));
+        return dynamic_cast<SampledGenerator&>(*FakeGenerator::living.back());
+    }
+    std::vector<std::string> samplesOf(std::uint64_t packet) {
+        driver.update({}, {packet, clock.now()});
+        return recorder.takeLines();
+    }
+
+    using Lines = std::vector<std::string>;
+    doubles::SampleRecorder recorder;
+};
+
+TEST_F(SampledDriverTest, EachPacketOfTheSinkBeginsAndEnds) {
+    setSampledGenerator();
+    driver.setSampleSink(&recorder);
+    EXPECT_EQ(samplesOf(7), (Lines{"packet 7", "removed in the packet", "end of packet"}));
+    EXPECT_EQ(samplesOf(8), (Lines{"packet 8", "removed in the packet", "end of packet"}));
+    driver.setSampleSink(nullptr);
+    EXPECT_EQ(samplesOf(9), Lines{});
+}
+
+TEST_F(SampledDriverTest, APacketWhoseRecordThrowsEndsToo) {
+    setSampledGenerator().refusePackets = true;
+    driver.setSampleSink(&recorder);
+    EXPECT_THROW(driver.update({}), std::runtime_error);
+    EXPECT_EQ(recorder.takeLines(), (Lines{"packet 0", "removed in the packet", "end of packet"}));
+    EXPECT_FALSE(driver.takeUpdated());
+}
+
+TEST_F(SampledDriverTest, WithoutAGeneratorPacketsAreEmpty) {
+    driver.setSampleSink(&recorder);
+    EXPECT_EQ(samplesOf(1), (Lines{"packet 1", "end of packet"}));
+}
+
+TEST_F(SampledDriverTest, AGeneratorThatIsSetLaterGetsTheSink) {
+    driver.setSampleSink(&recorder);
+    EXPECT_EQ(setSampledGenerator().samples, &recorder);
+    driver.setSampleSink(nullptr);
+    EXPECT_EQ(setSampledGenerator().samples, nullptr);
 }
 
 } // namespace
