@@ -83,7 +83,8 @@ private:
         _next = id;
     }
 
-    void readSpecial(const Field& field, FieldId id, const LogRecord& place) {
+    /// Apart, because it is rare and would slow the loop down.
+    [[gnu::noinline]] void readSpecial(const Field& field, FieldId id, const LogRecord& place) {
         if (field.condition != nullptr) {
             const std::int64_t number = numberOf(*field.condition, place);
             if (!field.condition->holdsFor(number)) {
@@ -159,7 +160,10 @@ private:
             _place.around = place;
             _next = first;
             _sink.beginEntry(index, list.entryName ? entry.read(*list.entryName) : 0);
-            readIn(entry, list.fields, list.lists);
+            readFields(entry, list.fields);
+            for (const ListLayout& inner : list.lists) {
+                readList(inner, entry);
+            }
             _sink.endEntry();
         }
         _sink.endList();
