@@ -1,5 +1,6 @@
 #include "tests/cli/EndToEnd.h"
 #include "tests/doubles/Files.h"
+#include "tests/doubles/WholeGsm.h"
 
 #include <nlohmann/json.hpp>
 
@@ -91,7 +92,7 @@ TEST_F(EndToEnd, DecodeOfTheSampleIsJsonAtItsEndEachTickAndEachPacket) {
     for (std::size_t index = 0; index < ticks.size(); ++index) {
         EXPECT_EQ(ticks[index].size(), 3U);
         EXPECT_EQ(ticks[index]["tick"], index + 1);
-        EXPECT_EQ(ticks[index]["display"].size(), 26U);
+        EXPECT_EQ(ticks[index]["display"].size(), doubles::kWholeGsm.registration.size());
     }
     EXPECT_EQ(ticks.back()["time"], "2023-11-14T22:13:50.000Z");
     const auto end = linesOf(run({"decode", "--every", "end", recording}).out);

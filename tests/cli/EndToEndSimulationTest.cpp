@@ -2,6 +2,7 @@
 #include "simulator/Simulation.h"
 #include "tests/cli/EndToEnd.h"
 #include "tests/doubles/Files.h"
+#include "tests/doubles/WholeTechnologies.h"
 
 #include <map>
 #include <set>
@@ -53,30 +54,24 @@ std::map<std::string, bool> sectionsIn(const std::string& printed) {
 }
 
 TEST_F(EndToEndSimulation, ADemoOfEachTechnologyFillsEverySectionThatCanFillWithinAMinute) {
-    // Those whose records take no code, or add no entry.
-    const std::map<std::string_view, std::set<std::string>> neverFilled = {
-        {"gsm",
-         {"Coding Scheme", "UMTS RR Measurement", "Cell Change Counters", "Non-Ranked GSM Set",
-          "Non-Ranked UMTS Set", "Detected Set", "Monitored Set", "Virtual Active Set"}},
-        {"utran", {"GSM Neighbor Cell List"}},
-    };
-    const std::map<std::string_view, std::size_t> counts = {
-        {"ifx", 5}, {"gsm", 26}, {"cdma", 4}, {"lte", 11}, {"utran", 8}};
+    const std::map<std::string_view, std::size_t> withoutRecords = {{"ifx", 5}, {"cdma", 4}};
     for (const RecordedTechnology* technology : simulatedTechnologies()) {
         SCOPED_TRACE(technology->commandName);
         const Run demo = run({"demo", std::string(technology->commandName), "--seconds", "60",
                               "--speed", "max", "--print"});
         EXPECT_EQ(demo.status, 0);
         const auto sections = sectionsIn(demo.out);
-        EXPECT_EQ(sections.size(), counts.at(technology->commandName));
+        const auto& whole = doubles::wholeTechnology(technology->commandName);
+        const auto without = withoutRecords.find(technology->commandName);
+        EXPECT_EQ(sections.size(),
+                  without != withoutRecords.end() ? without->second : whole.registration.size());
         std::set<std::string> empty;
         for (const auto& [section, isFilled] : sections) {
             if (!isFilled) {
                 empty.insert(section);
             }
         }
-        const auto never = neverFilled.find(technology->commandName);
-        EXPECT_EQ(empty, never != neverFilled.end() ? never->second : std::set<std::string>());
+        EXPECT_EQ(empty, whole.emptyInDrives());
     }
 }
 

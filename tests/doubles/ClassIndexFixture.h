@@ -6,12 +6,11 @@
 #include "tests/doubles/RecordFixture.h"
 #include "tests/doubles/RecordingLog.h"
 #include "tests/doubles/TemplateCheck.h"
+#include "tests/doubles/WholeTechnology.h"
 
 #include <gtest/gtest.h>
 
-#include <map>
 #include <string>
-#include <utility>
 #include <vector>
 
 namespace pallax::doubles {
@@ -21,11 +20,8 @@ template <class Index>
 class ClassIndexFixture : public testing::Test {
 protected:
     using Names = std::vector<std::string>;
-    /// The sections of a log code's subscribers, in call order.
-    using Subscribers = std::map<LogCode, Names>;
-
-    /// A record's section, and how many codes the record subscribes to.
-    using Registrations = std::vector<std::pair<std::string, int>>;
+    using Subscribers = decltype(WholeTechnology::subscribers);
+    using Registrations = decltype(WholeTechnology::registration);
 
     /// Each log code of the table has exactly its subscribers, and no other code has any: the index
     /// wants no others, and `unwanted`, a code outside the table, has none.

@@ -2,31 +2,24 @@
 
 #include "LogGenerator/UTRAN/UTRANLogGenerator.h"
 #include "tests/doubles/ClassIndexFixture.h"
+#include "tests/doubles/WholeUtran.h"
 
 #include <gtest/gtest.h>
 
-/// The whole technology: who reads which log code, and the order of the records.
 namespace pallax {
 namespace {
 
+using doubles::kWholeUtran;
 using Names = std::vector<std::string>;
-
-/// Who gets the packets of a log code, in call order.
-const std::map<LogCode, Names> kSubscribers = {
-    {0xD00A, {"Neighbor Cell List"}},     {0xD00C, {"TRCH BLER", "CCTRCH SIR"}},
-    {0xD00E, {"GSM Neighbor Cell List"}}, {0xD0E0, {"RRC Info"}},
-    {0xD0E2, {"Serving Cell Info"}},      {0xFF0000, {"SIM Info"}},
-    {0xFF0001, {"Serving Cell Info"}},    {0xFF0002, {"PDP Context Info"}},
-};
 
 class UTRANClassIndexTest : public doubles::ClassIndexFixture<UTRANClassIndex> {};
 
 TEST_F(UTRANClassIndexTest, SubscribersInCallOrderAndExactlyTheCodesOfItsRecords) {
-    expectSubscribers(kSubscribers, 0xD00B);
+    expectSubscribers(kWholeUtran.subscribers, 0xD00B);
 }
 
 TEST_F(UTRANClassIndexTest, TheStartCommandHoldsExactlyTheCodesOfItsRecords) {
-    expectStartCommand(kSubscribers, UTRANLogGenerator::generator, "UTRAN");
+    expectStartCommand(kWholeUtran.subscribers, UTRANLogGenerator::generator, "UTRAN");
 }
 
 TEST_F(UTRANClassIndexTest, TemplateAndRecordsMatchBothWays) {
@@ -34,16 +27,7 @@ TEST_F(UTRANClassIndexTest, TemplateAndRecordsMatchBothWays) {
 }
 
 TEST_F(UTRANClassIndexTest, ItsRecordsRegisterInTheirOrder) {
-    expectRegistration({
-        {"RRC Info", 1},
-        {"Serving Cell Info", 2},
-        {"Neighbor Cell List", 1},
-        {"GSM Neighbor Cell List", 1},
-        {"TRCH BLER", 1},
-        {"CCTRCH SIR", 1},
-        {"PDP Context Info", 1},
-        {"SIM Info", 1},
-    });
+    expectRegistration(kWholeUtran.registration);
 }
 
 TEST_F(UTRANClassIndexTest, TheShippedTemplateShowsEveryRecord) {
