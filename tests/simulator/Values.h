@@ -3,6 +3,7 @@
 #include "tests/doubles/Property.h"
 #include "tests/simulator/SimulatedPhone.h"
 
+#include <algorithm>
 #include <string>
 #include <vector>
 
@@ -21,6 +22,25 @@ inline double onGrid(double least, double step, unsigned count) {
 }
 inline std::string text(unsigned number) {
     return std::to_string(number);
+}
+
+/// Whether all of `expected` is shown: the keys of a dictionary, which may have others that no
+/// encoder fills, and the entries of a list.
+inline bool shows(const PropertyList& shown, const PropertyList& expected) {
+    if (const DictionaryRef keys = expected.dictionary()) {
+        const DictionaryRef in = shown.dictionary();
+        return in != nullptr &&
+               std::all_of(keys->begin(), keys->end(), [&](const Dictionary::Entry& each) {
+                   const PropertyList* value = in->find(each.key.view());
+                   return value != nullptr && shows(*value, each.value);
+               });
+    }
+    if (const ArrayRef list = expected.array()) {
+        const ArrayRef in = shown.array();
+        return in != nullptr &&
+               std::equal(in->begin(), in->end(), list->begin(), list->end(), shows);
+    }
+    return shown == expected;
 }
 
 /// One of a record's labels, with the number that stands for it.
