@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include <array>
+#include <memory>
 
 namespace pallax {
 namespace {
@@ -149,6 +150,16 @@ TEST_F(SectionDisplayTest, NothingIsWrittenWithoutASectionOrIntoOneOfTheWrongKin
     EXPECT_EQ(section, PropertyList("neither"));
 }
 
+TEST_F(SectionDisplayTest, ANewSectionTakesThePlaceOfOneOfTheOtherKind) {
+    const PropertyList list{Array{"kept"}};
+    display.setSection(list);
+    give(Dictionary());
+    show(kAgents, {1, 5, 6});
+    show(kTurn, {1});
+    EXPECT_EQ(list, PropertyList(Array{"kept"}));
+    EXPECT_EQ(section, PropertyList(Dictionary{{"Turn", "1"}}));
+}
+
 TEST_F(SectionDisplayTest, ACodeMayTakeAwayKeysAndEmptyTheList) {
     give(Dictionary{{"Turn", "1"}, {"Stays", "2"}});
     show(kRemoves, {});
@@ -194,10 +205,21 @@ TEST_F(SectionDisplayTest, TheListIsFilledUnderTheArrayLock) {
 TEST_F(SectionDisplayTest, AnEntryIsUsedAgain) {
     give(Array());
     show(kAgents, {1, 1, 2});
-    const Dictionary* before = entry(0);
+    const std::weak_ptr<Dictionary> before = section.array()->at(0).dictionary();
     show(kAgents, {1, 3, 4});
-    EXPECT_EQ(entry(0), before);
+    EXPECT_EQ(before.lock().get(), entry(0));
     EXPECT_EQ(section, PropertyList(Array{Dictionary{{"Left", "3"}, {"Right", "4"}}}));
+}
+
+TEST_F(SectionDisplayTest, AnEntryIsFilledFromItsStartWhoeverFilledItBefore) {
+    Dictionary other{{"Left", "1"}, {"Right", "2"}};
+    other.setFixed("Left", "3"); // where the next key to be set would be "Right"
+    Array entries;
+    entries.emplace_back(std::move(other));
+    give(std::move(entries));
+    entry(0)->setFixed("Left", "4");
+    show(kAgents, {1, 5, 6});
+    EXPECT_TRUE(doubles::sameInOrder(*entry(0), {{"Left", "5"}, {"Right", "6"}}));
 }
 
 TEST_F(SectionDisplayTest, AnEntryThatIsHeldElsewhereStaysAsItIs) {
