@@ -7,7 +7,7 @@ namespace pallax {
 namespace {
 
 std::recursive_mutex& lock() {
-    // Never destroyed: a thread may hold it, by the rule above, until the process ends.
+    // Never destroyed: a thread may hold it until the process ends.
     static auto* mutex = new std::recursive_mutex;
     return *mutex;
 }

@@ -58,8 +58,8 @@ std::int16_t Base::lookUpECNO(std::uint32_t value) {
         std::uint32_t least;
         std::int16_t decibels;
     };
-    // Each band reaches up to the one before it. The -31 band is twice as wide as its
-    // neighbours, and below it there is nothing to measure.
+    // Each band ends where the one above it begins. The -31 band is twice as wide as its
+    // neighbours; values below it are too small to measure.
     static constexpr Band kBands[] = {
         {417648, -1}, {331809, -2}, {263625, -3}, {209464, -4}, {166442, -5}, {132269, -6},
         {105124, -7}, {83563, -8},  {66436, -9},  {52831, -10}, {42024, -11}, {33441, -12},

@@ -59,7 +59,7 @@ void ClassIndex::bringDisplayUpToDate() const {
 }
 
 void ClassIndex::status() const {
-    // The section dictionary is one by its type here; the two lines stay for those who read logs.
+    // Always a dictionary here; log readers expect both lines.
     systemLog(LogPriority::Warning, "Dictionary = %d", 1);
     systemLog(LogPriority::Warning, "String = %d", 0);
 }

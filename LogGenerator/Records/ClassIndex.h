@@ -22,16 +22,15 @@ public:
     ClassIndex(const ClassIndex&) = delete;
     ClassIndex& operator=(const ClassIndex&) = delete;
 
-    /// Every record by its section name.
     const ClassDict& classes() const { return classDict; }
     /// The record of that section, or null.
     Base* getClass(std::string_view sectionName) const;
-    /// The records subscribed to the code in call order, or null when nobody wants it. Valid as
-    /// long as the index.
+    /// The records subscribed to the code, in call order; null when there are none. Valid as long
+    /// as the index.
     const std::vector<Base*>* getSubscribers(LogCode logCode) const;
     /// Every code that has a subscriber, as decimal text, ascending.
     std::vector<std::string> getAllLogCodes() const;
-    /// The records in the order of their creation, in which their rows of fields are numbered.
+    /// A record and the number of its first field; numbers follow the order of creation.
     struct Numbered {
         LayoutRecord* record;
         FieldId firstRow;
@@ -44,7 +43,7 @@ public:
     /// Gives the samples of all records to `sink`, too, until it is null. The sink outlives the
     /// index, or is taken away.
     void setSink(SampleSink* sink);
-    /// Brings every section up to the latest record. The sections of an index may lag behind it.
+    /// Brings every section up to date with the latest log record.
     void bringDisplayUpToDate() const;
     /// Logs what the section dictionary is.
     void status() const;

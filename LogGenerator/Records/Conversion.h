@@ -13,24 +13,24 @@ namespace pallax {
 /// How a raw number becomes a display value: a label, or a number with its format. Formats and
 /// tables live as long as the program.
 struct Conversion {
-    /// Of a number: raw × factor / divisor + offset, computed in double precision and cut toward
-    /// zero where the format is an integer's. Null for a label.
+    /// For a number: raw × factor / divisor + offset, computed in double precision, truncated
+    /// toward zero if the format is for integers. Null for a label.
     const NumberFormat* format = nullptr;
     double factor = 1.0;
-    double divisor = 1.0; ///< for decimal fractions, which no factor is exactly
+    double divisor = 1.0; ///< for decimal fractions, which a factor cannot hold exactly
     double offset = 0.0;
     bool isScaled = false; ///< by any of the three: said once, for it is asked of each number
 
-    /// labels[raw + shift]; with a shift other than 0 the index is cut to 8 bits, so that the byte
-    /// 255 finds the first entry at a shift of 1.
+    /// labels[raw + shift]. If the shift is not 0, the index is cut to 8 bits, so that with a
+    /// shift of 1 the byte 255 selects the first entry.
     std::span<const std::string_view> labels = {};
     std::uint8_t shift = 0;
-    /// Where the table has no entry: the low 32 bits of the raw number under `beyondFormat`, or
-    /// `beyond` where that is null.
+    /// Shown for numbers outside the table, unless `beyondFormat` is set, which then formats the
+    /// low 32 bits of the raw number.
     std::string_view beyond = {};
     const NumberFormat* beyondFormat = nullptr;
 
-    /// The one raw number that shows `exceptionalText` whatever the rest says.
+    /// The raw number that is shown as `exceptionalText`.
     std::optional<std::int64_t> exceptional = std::nullopt;
     std::string_view exceptionalText = {};
 
@@ -63,7 +63,7 @@ struct Conversion {
     static Conversion label(std::span<const std::string_view> labels,
                             const NumberFormat&& beyond) = delete;
 
-    /// `set` for every raw value but 0, which shows `clear`.
+    /// Shows `clear` for 0, and `set` for every other raw number.
     static constexpr Conversion flag(std::string_view set, std::string_view clear) {
         Conversion result;
         result.beyond = set;
@@ -72,7 +72,7 @@ struct Conversion {
         return result;
     }
 
-    /// This conversion of a number, with the divisor.
+    /// This conversion with the divisor `by`.
     constexpr Conversion dividedBy(double by) const {
         Conversion result = *this;
         result.divisor = by;
@@ -80,7 +80,7 @@ struct Conversion {
         return result;
     }
 
-    /// This conversion for every raw value but `raw`, which shows `text` ("Not Present").
+    /// This conversion, except that `raw` is shown as `text` ("Not Present").
     constexpr Conversion except(std::int64_t raw, std::string_view text) const {
         Conversion result = *this;
         result.exceptional = raw;
@@ -89,7 +89,7 @@ struct Conversion {
     }
 
     SampleValue valueOf(std::int64_t raw) const;
-    /// By what a raw number is multiplied, for those who tell it.
+    /// What a raw number is multiplied by, for documents.
     constexpr double scale() const { return factor / divisor; }
 };
 

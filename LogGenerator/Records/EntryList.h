@@ -9,14 +9,14 @@
 
 namespace pallax {
 
-/// The repeated entries of a record, as many as the record says, of which only whole ones are
-/// ever walked: an entry is whole when every byte that is read for it lies inside the record.
+/// The repeated entries of a record. The record claims their number, but only whole entries are
+/// walked: those whose bytes, as far as they are read, all lie inside the record.
 class EntryList {
 public:
     struct Layout {
         std::size_t start;     ///< of entry 0, from byte 0 of the record
         std::size_t stride;    ///< from one entry's start to the next
-        std::size_t bytesRead; ///< from an entry's start to behind the last byte read of it
+        std::size_t bytesRead; ///< from an entry's start to the end of the last byte read
     };
 
     EntryList(const LogRecord& record, const Layout& layout, std::size_t count)
@@ -37,8 +37,8 @@ public:
         return _record.has(_layout.start + index * _layout.stride + _layout.bytesRead);
     }
 
-    /// How many entries stand before the first one that is not whole. For layouts with a stride
-    /// of at least 1, so that what a record claims costs no more than what it holds.
+    /// The number of entries before the first one that is not whole. The stride must be at least
+    /// 1, so that the cost depends on the record's size, not on the number it claims.
     std::size_t wholeCount() const {
         const std::size_t first = _layout.start + _layout.bytesRead;
         if (!_record.has(first)) {
@@ -47,8 +47,8 @@ public:
         return std::min(_count, (_record.length() - first) / _layout.stride + 1);
     }
 
-    /// A list of what `make` (LogRecord entry, std::size_t index -> PropertyList) gives for each
-    /// entry up to the first that is not whole.
+    /// Calls `make` (LogRecord entry, std::size_t index -> PropertyList) for each entry up to the
+    /// first that is not whole, and returns the results.
     template <class Make>
     Array map(const Make& make) const {
         const std::size_t whole = wholeCount();

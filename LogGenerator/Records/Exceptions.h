@@ -13,8 +13,8 @@ public:
         : std::logic_error("unrecognised operation: " + operation) {}
 };
 
-/// Thrown by an element accessor of a record layout when the index is not below the element
-/// count that the record itself carries. Nothing in the core catches it.
+/// Thrown by an element accessor when the index is not below the element count that the record
+/// carries. The core does not catch it.
 class ArrayOutOfBoundsException : public std::exception {
 public:
     const char* what() const noexcept override {

@@ -2,7 +2,7 @@
 
 #include "text/NumberFormat.h"
 
-/// The formats that several records share.
+/// Formats shared by several records.
 namespace pallax {
 
 inline constexpr NumberFormat kDecimal{"%d"};

@@ -14,22 +14,21 @@
 #include <string_view>
 #include <unordered_map>
 
-/// What a log record holds, as constexpr data. A layout is the decoder: reading a record, the codes
-/// that are asked for, which records must be read at once, the manual page, the tables of
+/// The content of log records, as constexpr data. A layout is the decoder: how a record is read,
+/// which codes are requested, which records are read at once, the manual page, the tables of
 /// docs/records, the dissector and the registry of fields all follow from it.
 ///
-/// Positions count from the first byte of what a field stands in: the record (its header
-/// included), an entry of a list, or a subpacket. Texts, tables and formats live as long as the
-/// program.
+/// Positions count from the first byte of the field's container: the record (with its header),
+/// an entry of a list, or a subpacket. Texts, tables and formats live as long as the program.
 namespace pallax {
 
-/// What kind of section a template must hold for a record.
+/// The kind of section that the template must hold for a record.
 enum class SectionKind { Keys, List };
 
-/// Bytes that a computed value is made of.
+/// Bytes from which a value is computed.
 struct Extent {
     enum class Origin {
-        Here,      ///< where the field stands
+        Here,      ///< in the field's container
         Record,    ///< from byte 0 of the record
         Companion, ///< the entry of the list's companion run with the same index
     };
@@ -39,58 +38,58 @@ struct Extent {
     Origin origin = Origin::Here;
 };
 
-/// The whole bytes that hold a position.
+/// The bytes that contain a position.
 constexpr Extent extentOf(const Position& position, Extent::Origin origin = Extent::Origin::Here) {
     constexpr unsigned kByteBits = 8;
     return {position.byte, (position.bit + position.width + kByteBits - 1) / kByteBits, origin};
 }
 
-/// A 32-bit counter that counts with a weight.
+/// A 32-bit counter with its weight in a sum.
 struct Counter {
     std::size_t byte;
     std::uint32_t weight;
 };
 
-/// Something holds only while a number lies from `least` to `most`.
+/// Holds while a number lies between `least` and `most`, both included.
 struct Condition {
     Position position;
     std::int64_t least = 0;
     std::int64_t most = 0;
-    /// Shown for a field while it does not hold: a text, or a format of that number. Empty: the
-    /// field is then not shown at all.
+    /// Shown for a field while the condition does not hold: a text, or a format for the number.
+    /// Empty: the field is not shown.
     std::string_view otherwise = {};
-    /// The subpacket in which the number stands, where the record is made of subpackets.
+    /// The subpacket that contains the number, if the record consists of subpackets.
     std::optional<std::uint8_t> subpacket = std::nullopt;
 
     bool holdsFor(std::int64_t number) const { return number >= least && number <= most; }
     bool holdsIn(const LogRecord& place) const { return holdsFor(place.read(position)); }
 };
 
-/// What outlives one packet: entries of a list that others look up, and the running values of the
-/// technology's state.
+/// Data kept between packets: list entries that other records look up, and the running values in
+/// the technology's state.
 struct RecordMemory {
     std::unordered_map<std::int64_t, std::int64_t> remembered;
     Dictionary* state = nullptr; ///< CDMA only
 };
 
-/// Where a computed value is worked out.
+/// The input of a computation.
 struct Place {
-    LogRecord here;   ///< what the field stands in
-    LogRecord record; ///< all of it
+    LogRecord here;   ///< the field's container
+    LogRecord record; ///< the whole record
     LogRecord companion = {};
-    LogRecord around = {}; ///< of an entry: what its list stands in
+    LogRecord around = {}; ///< for a field of an entry: the container of its list
     RecordMemory* memory = nullptr;
 };
 
-/// A value that is no single number of the record.
+/// Computes a value that is not a single number of the record.
 struct Computation {
-    std::string_view name;    ///< for those who compute it elsewhere
+    std::string_view name;    ///< the dissector finds its own code for it by this name
     std::string_view formula; ///< in words
     std::span<const Extent> read;
-    /// The display value; null where there is none, and the key is not set.
+    /// The display value. If it is null, the key is not set.
     PropertyList (*compute)(const Place& place);
-    std::span<const Counter> counters = {}; ///< those among `read`, where there are some
-    /// It changes the memory, so that every record counts.
+    std::span<const Counter> counters = {}; ///< the counters in `read`, if any
+    /// Changes the memory, so every record must be read.
     bool isRunning = false;
 };
 
@@ -98,17 +97,17 @@ struct Computation {
 struct Field {
     std::string_view key =
         {}; ///< CDMA: the lookup name. Empty: the list's entry is the value itself
-    std::optional<Position> position = std::nullopt; ///< of the raw number, where there is one
+    std::optional<Position> position = std::nullopt; ///< of the raw number, if there is one
     Conversion conversion = {};
-    std::string_view meaning = {}; ///< a sentence; empty where an earlier row of the section has it
+    std::string_view meaning = {}; ///< a sentence; empty if an earlier row of the section has it
     const Computation* computation = nullptr;
     const Condition* condition = nullptr;
-    /// Of a property list: the key that holds the value, what is logged where there is none, and
-    /// how many low bits of the number count, as a signed one (0: all).
+    /// In a property list: the value's key, the line that is logged if it is missing, and how many
+    /// low bits of the number are used, as a signed number (0: all).
     std::string_view listKey = {};
     std::string_view failure = {};
     unsigned listBits = 0;
-    bool identifies = false; ///< with the others that do, which cell, pilot or context an entry is
+    bool identifies = false; ///< part of the entry's identity (a cell, pilot or context)
     bool isPersonal = false; ///< identifies a person
 
     constexpr Field when(const Condition& holds) const {
@@ -128,7 +127,7 @@ struct Field {
     }
 };
 
-/// A field that a function works out, shown under `format` where it is a number.
+/// A field that a function computes; a number is shown with `format`.
 constexpr Field computed(std::string_view key, const NumberFormat& format,
                          const Computation& computation, std::string_view meaning = {}) {
     Field field{key, std::nullopt, Conversion::number(format), meaning};
@@ -142,9 +141,9 @@ constexpr Field computed(std::string_view key, const Computation& computation,
     return field;
 }
 
-/// Entries that follow one another.
+/// Consecutive entries.
 struct EntryRun {
-    /// The whole run starts later by `bytes` for each unit of the number at `count`.
+    /// Moves the start of the run by `bytes` for each unit of the number at `count`.
     struct Move {
         std::size_t bytes;
         Position count;
@@ -162,44 +161,44 @@ struct EntryRun {
     }
 };
 
-/// The claimed length of a list against the record's, both cut to 8 bits: a list that seems too
-/// long, or claims no entry, is emptied, and that is logged. `otherLength` bytes for each unit at
-/// `otherCount` belong to another list.
+/// Compares the claimed length of a list with the record's length, both cut to 8 bits. A list that
+/// seems too long, or claims no entries, is emptied, with a line in the log. `otherLength` bytes
+/// for each unit at `otherCount` belong to another list.
 struct SizeCheck {
     Position otherCount;
     std::size_t otherLength;
 };
 
-/// Repeated entries.
 struct ListLayout {
-    /// Which entries of a record that is too short are shown.
+    /// Which entries are shown if the record is too short.
     enum class Fit {
         UpToFirstCut,
-        AllOrNothing, ///< none unless all lie inside
-        Exact,        ///< none unless the record ends with the last one
+        AllOrNothing, ///< none unless all lie inside the record
+        Exact,        ///< none unless the record ends with the last entry
     };
 
-    std::string_view key = {}; ///< under which the list is shown; empty: the section is the list
+    std::string_view key = {}; ///< shown under this key; empty: the section is the list
     EntryRun entries = {};
-    /// How many: the number at `count`, or 0 without one, and `plus`.
+    /// The number of entries is the number at `count` (0 without one) plus `plus`.
     std::optional<Position> count = std::nullopt;
-    std::span<const Field> fields = {}; ///< of an entry; a single one without key: plain values
+    std::span<const Field> fields = {}; ///< of an entry; one field without key: plain values
     std::string_view meaning = {};
     std::size_t plus = 0;
     Fit fit = Fit::UpToFirstCut;
     std::optional<SizeCheck> sizeCheck = std::nullopt;
     std::span<const ListLayout> lists = {};
-    const Condition* only = nullptr;                  ///< the entries that are shown
-    std::optional<EntryRun> companion = std::nullopt; ///< what else belongs to an entry
-    std::optional<Position> entryName = std::nullopt; ///< of a list by pilot: the PN offset
+    const Condition* only = nullptr;                  ///< shows only the entries for which it holds
+    std::optional<EntryRun> companion = std::nullopt; ///< the second part of each entry
+    std::optional<Position> entryName = std::nullopt; ///< in a list by pilot: the PN offset
     std::string_view ifEmpty = {};                    ///< shown for a list without entries
-    /// Entries that lie as no run does: in words, and as what. `entries` is then empty.
+    /// For entries whose places vary with the record: the rule in words, and the function that
+    /// computes them. `entries` is then empty.
     std::string_view formula = {};
     EntryList::Layout (*varying)(const LogRecord& place) = nullptr;
-    /// A record that tells of no entry leaves the list as it was.
+    /// A record without entries leaves the list as it was.
     bool staysWithoutEntries = false;
-    bool isShown = true; ///< false: read, and kept from the display
-    /// Other entries look up the second field by the first, under this name.
+    bool isShown = true; ///< false: read, but not shown
+    /// Other records look up the second field by the first, under this name.
     std::string_view rememberedAs = {};
 
     std::size_t countIn(const LogRecord& place) const {
@@ -209,36 +208,36 @@ struct ListLayout {
         return {place, varying != nullptr ? varying(place) : entries.layoutIn(place),
                 countIn(place)};
     }
-    /// The bytes of the entries that the record claims, and those it has for them, as the modem
-    /// counts them: in 8 bits. Only with a size check.
+    /// The size of the entries in bytes, as the record claims it and as it has room for, each cut
+    /// to 8 bits.
     struct Sizes {
         std::uint8_t expected;
         std::uint8_t actual;
     };
-    /// Both where the list has a size check and the record claims no entries, or more than it seems
-    /// to have room for.
+    /// Both sizes, if the list has a size check and the record claims no entries, or more than it
+    /// seems to have room for.
     std::optional<Sizes> unexpectedSizes(const LogRecord& record) const;
 };
 
-/// Of which part of a property list the fields of a record are.
+/// The part of a property list that contains the fields of a record.
 struct ListPart {
     enum class Kind {
-        Keys,        ///< the list itself, a dictionary; its values are shown as they come
-        Elements,    ///< each element of the list, an array, is an entry, as it comes
-        FirstCell,   ///< of an array of cells the first one that is looked for
-        EachCell,    ///< each of them; of a key that several have, the last value stays
-        CellEntries, ///< each of them is an entry of the section's list
+        Keys,        ///< a dictionary, whose values are shown unchanged
+        Elements,    ///< an array, whose elements become the entries, unchanged
+        FirstCell,   ///< an array of cells: the first match
+        EachCell,    ///< an array of cells: each match; later values replace earlier ones
+        CellEntries, ///< an array of cells: each match is an entry of the section's list
     };
 
     Kind kind;
-    /// The list, or nothing once it has said why there is none.
+    /// The list, or nothing after logging why there is none.
     std::optional<PropertyList> (*parse)(const LogRecord& record);
-    // Which cells are looked for: the telephony service's constants.
+    // Which cells match: the telephony service's constants.
     std::span<const std::string_view> technologies = {};
     std::string_view cellType = {};
-    std::string_view words = {}; ///< what the list is, where it is none of cells
+    std::string_view words = {}; ///< describes a list that does not contain cells
 
-    /// Whether the section is a list, and each such part an entry of it.
+    /// Whether the parts are entries of a section that is a list.
     bool isEntries() const { return kind == Kind::Elements || kind == Kind::CellEntries; }
     bool looksFor(const PropertyList& element) const;
 };
@@ -249,45 +248,45 @@ struct SubpacketLayout {
     std::span<const ListLayout> lists = {};
 };
 
-/// What one log code of a record holds.
+/// The content of log records under one code.
 struct CodeLayout {
     LogCode logCode;
-    std::string_view name = {};    ///< of the log record; empty where another section names it
-    std::size_t minimumLength = 0; ///< of the log record; a shorter one is ignored
-    bool exactLength = false;      ///< a longer one as well
-    const Condition* condition = nullptr; ///< of the whole record
+    std::string_view name = {};           ///< of the log record; empty if another section names it
+    std::size_t minimumLength = 0;        ///< shorter log records are ignored
+    bool exactLength = false;             ///< longer ones, too
+    const Condition* condition = nullptr; ///< for reading the record at all
 
     std::span<const Field> fields = {};
     std::span<const ListLayout> lists = {};
     std::span<const SubpacketLayout> subpackets = {};
-    const ListPart* listPart = nullptr; ///< of a record that is a property list
-    /// Keys of another code that no longer hold.
+    const ListPart* listPart = nullptr; ///< if the record is a property list
+    /// Keys of another code that are removed.
     std::span<const std::string_view> removes = {};
-    bool emptiesList = false;   ///< the section's, and shows nothing in it
-    std::string_view note = {}; ///< what else the record does: whole sentences
+    bool emptiesList = false;   ///< empties the section's list
+    std::string_view note = {}; ///< what else the record does, in whole sentences
 
-    /// Says what is wrong with a record, once for each, and whether it is read all the same. Null:
-    /// by `minimumLength`, `exactLength` and `condition`, without a word.
+    /// Logs what is wrong with a record and returns whether to read it. Null: `minimumLength`,
+    /// `exactLength` and `condition` decide, and nothing is logged.
     bool (*accepts)(const CodeLayout& code, const LogRecord& record) = nullptr;
-    /// Logs what an accepted record tells, before it is read.
+    /// Logs the content of an accepted record before it is read.
     void (*logs)(const CodeLayout& code, const LogRecord& record) = nullptr;
-    /// Logs what the section then shows; so each record is read when it arrives.
+    /// Logs the section after each record, which is therefore read when it arrives.
     void (*logsSection)(const LogRecord& record, const PropertyList& section) = nullptr;
 };
 
-/// One record class.
+/// The layout of a record class.
 struct RecordLayout {
-    std::string_view section; ///< its name
+    std::string_view section; ///< the section's name
     std::string_view logLine; ///< logged for each record, at `priority`
     SectionKind kind = SectionKind::Keys;
     std::string_view meaning = {};
-    std::span<const CodeLayout> codes = {}; ///< in the order of the subscriptions
+    std::span<const CodeLayout> codes = {}; ///< in the order of subscription
     LogPriority priority = LogPriority::Warning;
-    bool reportsOtherCodes = true; ///< as unknown log messages
-    bool readsOtherCodes = false;  ///< as the first of `codes`
+    bool reportsOtherCodes = true; ///< logs other codes as unknown log messages
+    bool readsOtherCodes = false;  ///< reads other codes like the first of `codes`
 };
 
-/// How many rows of fields there are: each field of each list once.
+/// The number of rows, where each field of a list counts once.
 std::size_t rowCount(std::span<const ListLayout> lists);
 std::size_t rowCount(const SubpacketLayout& subpacket);
 std::size_t rowCount(const CodeLayout& code);
@@ -299,19 +298,18 @@ inline bool isAllowed(const CodeLayout& code, const LogRecord& record) {
            (code.condition == nullptr || code.condition->holdsIn(record));
 }
 
-/// Whether records under the code may be read as late as somebody looks: reading one changes
-/// nothing but the section, and cannot fail.
+/// Whether records under the code may wait until the display is needed: reading them changes only
+/// the section and cannot fail.
 bool isReadLate(const CodeLayout& code);
-/// Whether its records may set different keys.
+/// Whether records under the code may set different keys.
 bool hasShapes(const CodeLayout& code);
-/// A number that is the same for records that set the same keys, so that the later one leaves
-/// nothing of the earlier.
+/// Equal for records that set the same keys, so that the later replaces the earlier entirely.
 unsigned shapeOf(const CodeLayout& code, const LogRecord& record);
 
 /// "Received an unknown log message: %d"
 void logUnknownLogCode(LogCode logCode);
 
-/// Keeps what the record's lists tell other records.
+/// Stores the record's list entries that other records look up.
 void remember(const CodeLayout& code, const LogRecord& record, RecordMemory& memory);
 
 } // namespace pallax

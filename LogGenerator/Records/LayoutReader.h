@@ -14,17 +14,16 @@
 
 namespace pallax {
 
-/// Reads a record as its layout says, and gives what it finds to a sink: the one loop over log
-/// records. A template for the display's sake, which takes a sample several times as fast when the
-/// compiler sees both sides.
+/// Reads a record according to its layout and gives the samples to a sink. It is a template because
+/// the display takes samples several times as fast when the compiler sees both sides.
 template <class Sink>
 class LayoutReader {
 public:
-    /// Rows are numbered from `first` on. All of it outlives the reader.
+    /// `first` is the number of the first row. `sink` and `memory` must outlive the reader.
     LayoutReader(Sink& sink, RecordMemory& memory, FieldId first)
         : _sink(sink), _memory(memory), _next(first) {}
 
-    /// For a record that the layout accepts.
+    /// Reads a record that the layout accepts.
     void read(const CodeLayout& code, const LogRecord& record) {
         _place.record = record;
         for (const std::string_view key : code.removes) {
@@ -43,7 +42,7 @@ public:
         }
     }
 
-    /// The fields and lists of a part of the record, such as a subpacket.
+    /// Reads the fields and lists of a part of the record, such as a subpacket.
     void readIn(const LogRecord& place, std::span<const Field> fields,
                 std::span<const ListLayout> lists) {
         readFields(place, fields);
@@ -116,7 +115,7 @@ private:
     void giveOtherwise(const Field& field, FieldId id, std::int64_t number) {
         const std::string_view otherwise = field.condition->otherwise;
         if (otherwise.find('%') != std::string_view::npos) {
-            // A text, for the number in it is not that of the row.
+            // A text, because the number in it is not the row's number.
             const std::string text = formatText(otherwise, {number});
             give(field, id, std::nullopt, SampleValue::text(text));
         } else if (!otherwise.empty()) {
@@ -137,7 +136,7 @@ private:
     void readEntries(const ListLayout& list, const LogRecord& place, FieldId first) {
         const EntryList entries = list.entriesIn(place);
         const std::size_t whole = list.unexpectedSizes(place) ? 0 : entries.wholeCount();
-        // No optional: of its content the compiler says that it may not be initialized.
+        // Not an optional: the compiler warns that its content may be uninitialized.
         const EntryList companions =
             list.companion ? EntryList(place, list.companion->layoutIn(place), entries.count())
                            : EntryList({}, {}, 0);
@@ -150,7 +149,7 @@ private:
             }
             if (list.companion) {
                 if (!companions.isWhole(index)) {
-                    break; // it is part of the entry
+                    break; // an entry needs its companion
                 }
                 _place.companion = companions.at(index);
             }

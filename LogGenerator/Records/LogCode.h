@@ -10,7 +10,7 @@ using LogCode = std::uint32_t;
 
 inline constexpr LogCode kExtendedLogCodes = 0xFF0000;
 
-/// The extra records that carry a serialized property list behind the header.
+/// The extra records that carry a serialized property list after the header.
 inline constexpr LogCode kSimFilesLogCode = 0xFF0000;
 inline constexpr LogCode kCellMonitorLogCode = 0xFF0001;
 inline constexpr LogCode kPDPContextsLogCode = 0xFF0002;

@@ -11,8 +11,8 @@
 
 namespace pallax {
 
-/// Where a number stands in a record: from bit `bit` of byte `byte` on (bit 0 is the least
-/// significant), `width` bits (1 to 32), the low bits in the lower bytes.
+/// The position of a number in a record: it begins at bit `bit` of byte `byte` (bit 0 is the least
+/// significant) and has `width` bits (1 to 32), the low bits in the lower bytes.
 struct Position {
     std::size_t byte = 0;
     unsigned bit = 0;
@@ -47,13 +47,13 @@ constexpr Position bitsAt(std::size_t byte, unsigned bit, unsigned width) {
     return {byte, bit, width};
 }
 
-/// The payload of a record as a property list, parsed when the first of the record's subscribers
-/// asks for it. (Each parsing it for itself was half of the time of decoding a GSM drive.)
+/// The payload of a record as a property list, parsed once for all subscribers, at the first use.
+/// (When each parsed it, this took half the time of decoding a GSM drive.)
 struct SharedPayload {
     std::optional<PropertyListResult> list;
 };
 
-/// The bounds-checked view of one log record, or of an entry inside one. Offsets count from its
+/// A bounds-checked view of one log record, or of an entry in one. Offsets count from its
 /// first byte; bytes past the end read as zero. It does not own the bytes.
 ///
 ///   byte  width  field
@@ -68,17 +68,17 @@ public:
 
     LogRecord() = default;
     explicit LogRecord(Bytes bytes) : _bytes(bytes) {}
-    /// A record that goes to several subscribers; `shared` outlives it.
+    /// A record for several subscribers; `shared` must outlive it.
     LogRecord(Bytes bytes, SharedPayload& shared) : _bytes(bytes), _shared(&shared) {}
 
     std::size_t length() const { return _bytes.size(); }
     Bytes bytes() const { return _bytes; }
     /// True when every byte below `end` lies inside.
     bool has(std::size_t end) const { return end <= _bytes.size(); }
-    /// What follows the header; empty when nothing does.
+    /// The bytes after the header; empty when there are none.
     Bytes payload() const { return from(kHeaderLength).bytes(); }
     PropertyListResult payloadAsPropertyList() const;
-    /// The view from `start` on; empty when that is past the end.
+    /// The view that begins at `start`; empty when that is past the end.
     LogRecord from(std::size_t start) const {
         return LogRecord(start < _bytes.size() ? _bytes.subspan(start) : Bytes());
     }
@@ -92,7 +92,7 @@ public:
     }
     std::int16_t s16(std::size_t at) const { return static_cast<std::int16_t>(u16(at)); }
 
-    /// The number at `position`, sign-extended where that is signed.
+    /// The number at `position`, sign-extended if it is signed.
     std::int64_t read(const Position& position) const {
         constexpr unsigned kBits = 64;
         const unsigned above = kBits - position.width;

@@ -94,7 +94,7 @@ void SectionDisplay::beginEntry(std::size_t /*index*/, std::int64_t /*name*/) {
 void SectionDisplay::endEntry() {
     Open& open = _open.back();
     if (!open.isPlain) {
-        entryOf(open).dropRest(); // of an entry without keys, all
+        entryOf(open).dropRest();
         open.list.emplace_back(std::move(open.entry));
     }
     open.entry.reset();

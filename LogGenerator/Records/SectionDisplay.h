@@ -10,22 +10,22 @@
 
 namespace pallax {
 
-/// The display sink of one section: writes samples into the section that the template processing
-/// has built. It writes nothing while there is no section, or one of the wrong kind.
+/// The display sink of one section: writes samples into the section that was built from the
+/// template. It writes nothing while the section is missing or of the wrong kind.
 ///
-/// Between two looks at the display a modem sends many records of one kind, each of which replaces
-/// all that the one before has shown. Such a record is kept, and read when the display is looked
-/// at; the layout tells which may be.
+/// Between two ticks a modem sends many records of one kind, and each replaces everything that the
+/// one before has shown. This sink keeps the latest and reads it when the display is needed. The
+/// layout tells which records may wait.
 class SectionDisplay final : public SampleSink {
 public:
     static constexpr bool kTakesHidden = false;
 
-    /// `memory` outlives it.
+    /// `memory` must outlive the sink.
     explicit SectionDisplay(RecordMemory& memory) : _memory(memory) {}
 
     void setSection(const PropertyList& section);
 
-    /// Whether records may wait until the display is brought up to date; not, unless it is set.
+    /// Whether records may wait until the display is brought up to date; false at first.
     void setLate(bool isLate) { _isLate = isLate; }
     /// How a record is read. Null code: none.
     struct Reading {
@@ -53,21 +53,21 @@ public:
     void endEntry() override;
 
 private:
-    /// A list that has begun and not ended.
+    /// A list that has begun but not ended.
     struct Open {
         std::string_view key;
         Array list;
-        DictionaryRef entry;  ///< that is being filled; null before its first key
-        bool isPlain = false; ///< its entry was a value without key
+        DictionaryRef entry;  ///< the current one; null before its first key
+        bool isPlain = false; ///< the current entry is a value without key
     };
 
     Dictionary& entryOf(Open& open);
-    /// A dictionary of the list that was there before, where nobody else holds it, else a new one.
-    /// Made anew, the entries of one list took half of the time of decoding a UTRAN drive.
+    /// An unshared dictionary of the previous list, or else a new one. (Allocating all entries of
+    /// one list took half the time of decoding a UTRAN drive.)
     DictionaryRef spareEntry();
 
     RecordMemory& _memory;
-    DictionaryRef _keys; ///< the section, of one or the other kind
+    DictionaryRef _keys; ///< the section; the one of the other kind is null
     ArrayRef _list;
     std::vector<Open> _open;
     Array _spares;
