@@ -21,9 +21,9 @@ enum class DlfResult : int { Success = 0, BufferTooSmall = 3 };
 /// The size of the version report record, with which a DLF log begins.
 inline constexpr std::size_t kDlfVersionReportSize = 161;
 
-/// Writes the version report record into the first 161 bytes of `buffer`; every byte that is not
-/// named is zero, multi-byte numbers are little-endian, texts are cut to their field and end in a
-/// NUL. `bytesWritten` is 0 on failure, and nothing else is then written.
+/// Writes the version report record into the first 161 bytes of `buffer`. Bytes not listed are
+/// zero, numbers are little-endian, and texts are cut to fit their field and end in a NUL. On
+/// failure `bytesWritten` is 0 and nothing else is written.
 ///
 ///   byte  bytes  field
 ///   0     2      record length, 161

@@ -8,7 +8,7 @@ namespace pallax {
 
 namespace {
 
-/// The entry of the state as it is now; it ends at the first value that is missing.
+/// A history entry of the current state; it ends before the first missing value.
 Dictionary historyEntry(const Dictionary& state, const Clock& clock) {
     Dictionary entry;
     for (const std::string_view key : {"DisplayState", "Display", "ExtraInfo"}) {

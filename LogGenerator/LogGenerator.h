@@ -17,7 +17,7 @@ class Resources;
 class SampleSink;
 class StandardOutput;
 
-/// What a generator needs of its surroundings. All of it outlives the generator.
+/// The services that a generator uses. They must outlive it.
 struct GeneratorEnvironment {
     const Clock& clock;             ///< history dates, the DLF's time stamp
     const Resources& resources;     ///< display templates
@@ -25,19 +25,19 @@ struct GeneratorEnvironment {
     StandardOutput& standardOutput; ///< destruction notices
 };
 
-/// One row of the technology table: what the modem answers, and who speaks it.
+/// One row of the technology table: an identifier of the modem and the generator for it.
 struct Technology {
     std::string_view identifier;
     std::unique_ptr<LogGenerator> (*generator)(const GeneratorEnvironment& environment);
 };
 
-/// The abstract base of every per-technology generator: turns log packets into a display
-/// dictionary and a save record, always working on the state dictionary that the model owns.
+/// The abstract base of the generators, one for each technology. A generator turns log packets
+/// into a display dictionary and a save record, and keeps them in a state that the model owns.
 ///
 /// The state's keys: "Template" (the display template as loaded), "Display" (the live display, up
-/// to date after `display`), "ExtraInfo", "DisplayState" (data: what was received since the
-/// previous display generation; of an object stream the latest object) and "History" (array of at
-/// most 5 entries, oldest first).
+/// to date after `display`), "ExtraInfo", "DisplayState" (data: everything received since the
+/// previous display generation, or the latest object of an object stream) and "History" (array of
+/// at most 5 entries, oldest first).
 class LogGenerator {
 public:
     static constexpr std::size_t kHistoryLength = 5;
@@ -49,16 +49,16 @@ public:
 
     /// Abstract operations throw UnrecognisedOperation unless overridden.
 
-    /// One message from the log channel; an empty one counts as null. A record that throws lets
-    /// its exception leave, and the packet is then not captured.
+    /// Reads one message from the log channel; an empty one counts as null. Exceptions of records
+    /// pass through, and the packet is then not captured.
     virtual void updateState(Dictionary& state, Bytes data);
     /// The display dictionary, or null when there is none yet. Rotates history and raw capture.
     virtual PropertyList generateLogUsingState(Dictionary& state);
-    /// The live display, with every packet that has arrived, or null when there is none yet. Its
-    /// sections are those of the history's entries, which are up to date afterwards too.
+    /// The live display, up to date with the latest packet, or null when there is none yet. The
+    /// history's entries share its sections and are therefore also brought up to date.
     PropertyList display(const Dictionary& state);
-    /// Gives the samples of later packets to `sink`, too, until it is null. The caller begins and
-    /// ends the packets. The sink outlives the generator, or is taken away.
+    /// Also gives the samples of later packets to `sink`; null stops it. The caller begins and ends
+    /// the packets. The sink must outlive the generator or be removed first.
     virtual void setSampleSink(SampleSink* /*sink*/) {}
     /// When the values of the display, with every packet that has arrived, were last read.
     SectionAges sectionAges(const Dictionary& state);
@@ -66,12 +66,12 @@ public:
     virtual bool keepsDisplay(const Dictionary& state) const;
     /// The property-list dictionary that starts the modem's stream.
     virtual PropertyList getStartCommand() const;
-    /// History entries and what else a snapshot file carries: an array.
+    /// The content of a snapshot file: an array of the history entries and any further ones.
     virtual PropertyList getSaveContentsFromState(const Dictionary& state) const;
 
-    /// Appends the current display to the state's history, of which the newest 5 stay. An entry
-    /// is a dictionary of "DisplayState", "Display", "ExtraInfo" (one-level copies), "Date" and
-    /// "Description"; a missing value ends it there.
+    /// Appends the current display to the state's history, which keeps the newest 5 entries. An
+    /// entry is a dictionary of "DisplayState", "Display", "ExtraInfo" (one-level copies), "Date"
+    /// and "Description", in this order; it ends before the first missing value.
     static void updateHistoryInState(Dictionary& state, const Clock& clock);
 
     /// A new generator of the first technology in `technologies` whose identifier equals
@@ -82,22 +82,21 @@ public:
                             const GeneratorEnvironment& environment);
 
 protected:
-    /// Brings the live display in the state up to the latest packet: a generator may read a packet
-    /// as late as that.
+    /// Brings the live display in the state up to date with the latest packet, for generators that
+    /// read packets late.
     virtual void bringDisplayUpToDate() {}
     /// The ages in the live display of the state, which is up to date. Nothing is known of them
     /// unless it is overridden.
     virtual SectionAges agesIn(const Dictionary& state) const;
 
-    /// Marks a generator whose parts are missing: its making is not logged, and what its class
-    /// builds up is left out.
+    /// Selects the constructors of a generator without parts, which log and build nothing.
     struct WithoutParts {};
     static constexpr WithoutParts kWithoutParts{};
     LogGenerator(const GeneratorEnvironment& environment, WithoutParts /*unused*/)
         : _environment(environment) {}
 
     const GeneratorEnvironment& environment() const { return _environment; }
-    /// The entries of the state's history, in an array of their own; none without one.
+    /// A copy of the state's history; empty if there is none.
     static Array historyOf(const Dictionary& state);
 
 private:

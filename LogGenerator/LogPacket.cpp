@@ -11,7 +11,7 @@ Bytes LogPacketStripPrefix(Bytes data) {
     }
     systemLog(LogPriority::Informational, "Log Header 0x%x", data[0]);
     if (data[0] != kTransportPrefix) {
-        // Asked here, for the dump is worth making only when somebody reads it.
+        // Checked here to avoid making a dump that is not logged.
         if (SystemLog::isEnabled(LogPriority::Warning)) {
             systemLog(LogPriority::Warning, "Returning buffer without modifications %s",
                       dumpOf(data.data(), data.size()));

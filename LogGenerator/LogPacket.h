@@ -11,8 +11,7 @@ inline constexpr std::uint8_t kTransportPrefix = 0x81;
 inline constexpr std::size_t kTransportPrefixLength = 2;
 
 /// The log record of a message: the message without its transport prefix, if it has one. Null
-/// (empty) for a null message and for one that holds nothing but the prefix. The record is a view
-/// into `data`.
+/// (empty) for a null message and for one that contains only the prefix. A view into `data`.
 ///
 ///   byte  width  field
 ///   0     8      0x81
@@ -20,10 +19,10 @@ inline constexpr std::size_t kTransportPrefixLength = 2;
 ///   2            the log record
 Bytes LogPacketStripPrefix(Bytes data);
 
-/// The same without a line in the log, for whoever only looks at a message in passing.
+/// The same without log lines, for callers other than the generators.
 Bytes LogPacketRecord(Bytes data);
 
-/// The bytes of a record that hold log type and log code.
+/// The end of the log type and log code in a record.
 inline constexpr std::size_t kLogCodeEnd = 5;
 
 /// The effective log code of a record of at least `kLogCodeEnd` bytes; checks neither length nor

@@ -9,8 +9,7 @@
 
 namespace pallax {
 
-/// When the packets came that the display's values were last read from, whether they changed the
-/// values or not.
+/// When the values of the display were last read from a packet, changed or not.
 class SectionAges {
 public:
     /// What stands at `path` of the display ("/" the root, "/Serving Cell", "/Serving Cell/ARFCN")

@@ -48,11 +48,11 @@ void ZORLogGenerator::handOverCapture(Dictionary& state) {
     const std::size_t captured = _binData->size();
     state.setFixed("DisplayState", SharedBytes(std::move(_binData)));
     _binData = std::make_shared<ByteBuffer>();
-    _binData->reserve(captured); // the next one will be of about that size
+    _binData->reserve(captured); // the next capture will have about the same size
 }
 
 std::optional<ByteBuffer> ZORLogGenerator::generateDlfFromState(const Dictionary& state) const {
-    // Only the first byte of a whole capture is dropped, not that of every packet in it.
+    // Only the first byte of the whole capture is dropped, not the first byte of each packet.
     constexpr std::size_t kSkipped = 1;
     auto log = dlfHeader(kDlfVersionReportSize, environment());
     if (!log) {

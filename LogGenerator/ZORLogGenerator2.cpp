@@ -11,7 +11,7 @@ namespace pallax {
 
 namespace {
 
-/// Logs the creation before the base is built, where the line belongs.
+/// Logs the creation before the base is built, because this line comes first.
 const GeneratorEnvironment& announced(const GeneratorEnvironment& environment,
                                       const ClassIndex* index) {
     systemLog(LogPriority::Error, "Creating ZORLogGenerator2 object with %p",
@@ -58,7 +58,7 @@ ZORLogGenerator2::ZORLogGenerator2(const GeneratorEnvironment& environment, Part
 }
 
 ZORLogGenerator2::~ZORLogGenerator2() {
-    // The text names one technology whatever the actual one is.
+    // All technologies log this text.
     systemLog(LogPriority::Warning, "ZOR_GSMLogGenerator is destructed %p",
               static_cast<const void*>(this));
 }
@@ -151,7 +151,7 @@ PropertyList ZORLogGenerator2::processTemplate(const PropertyList& object) {
             if (Base* record = cIndex->getClass(entry.key.view())) {
                 record->updateSectionRef(value);
             }
-            if (!value.isNull()) { // a dictionary holds no nothing
+            if (!value.isNull()) { // a dictionary cannot contain null
                 display->set(entry.key, std::move(value));
             }
         }

@@ -8,15 +8,15 @@
 
 namespace pallax {
 
-/// The template-driven generator: builds the display from a template resource, hands each
-/// section to the record that owns it, dispatches every log record to the records subscribed to
-/// its code, and asks the modem for exactly those codes.
+/// The template-driven generator. It builds the display from a template resource, gives each
+/// section to the record that owns it, dispatches each log record to the records subscribed to
+/// its code, and requests exactly those codes from the modem.
 ///
-/// A template is a property list of dictionaries, arrays and strings; a dictionary key that
-/// equals a record's section name makes its value that record's section, at any depth.
+/// A template is a property list of dictionaries, arrays and strings. If a dictionary key, at any
+/// depth, equals a record's section name, its value becomes that record's section.
 ///
-/// A technology that has no template to offer makes a generator without parts, on which every call
-/// does nothing and returns nothing.
+/// A technology without a template makes a generator without parts, whose calls do nothing and
+/// return nothing.
 class ZORLogGenerator2 : public ZORLogGenerator {
 public:
     ~ZORLogGenerator2() override;
@@ -26,21 +26,21 @@ public:
     void setSampleSink(SampleSink* sink) override;
     PropertyList getStartCommand() const override;
 
-    /// Framing and dispatch of one packet.
+    /// Checks the framing of one packet and dispatches it.
     void updateWithData(Bytes data);
-    /// The live display made from a template object; null for anything but dictionary, array and
-    /// string. Records get their sections on the way.
+    /// Makes the live display from a template object and gives records their sections. Null for
+    /// types other than dictionary, array and string.
     PropertyList processTemplate(const PropertyList& object);
-    /// Logs what a display must not hold; changes nothing.
+    /// Logs values that a display must not contain.
     static void printDict(const PropertyList& object);
-    /// The display. The call that builds it returns null, and only later calls return it.
+    /// The display. The first call builds it and returns null; later calls return it.
     PropertyList getDisplayFromState(Dictionary& state);
 
 protected:
     void bringDisplayUpToDate() override;
     SectionAges agesIn(const Dictionary& state) const override;
 
-    /// What a technology supplies: the template's resource name and a new class index.
+    /// The parts of a technology: the template's resource name and a new class index.
     struct Parts {
         std::string pListName;
         std::shared_ptr<ClassIndex> cIndex;

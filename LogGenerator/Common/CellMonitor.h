@@ -9,9 +9,9 @@
 #include <span>
 #include <string_view>
 
-/// The cell-monitor array: behind the header of the extended record 0xFF0001 stands a serialized
-/// property list, an array of dictionaries, one for each cell that the telephony service knows,
-/// keyed by its `kHXCellMonitor…` constants.
+/// The cell-monitor array: the payload of the extended record 0xFF0001 is a serialized property
+/// list, an array with one dictionary for each cell that the telephony service knows. The keys are
+/// the service's `kHXCellMonitor…` constants.
 namespace pallax {
 
 inline constexpr std::string_view kCellMonitorName = "Cell monitor";
@@ -19,12 +19,12 @@ inline constexpr std::string_view kCellMonitorName = "Cell monitor";
 inline constexpr std::string_view kLevelsNote =
     "Of a level only the low 16 bits count, as a signed number.";
 
-/// The array; nothing, with two lines in the log, when the payload is no property list.
+/// The array. Logs two lines and returns nothing when the payload is not a property list.
 std::optional<PropertyList> parseCellMonitorArray(const LogRecord& record);
-/// The same with the first of the two lines.
+/// The same, but logs only the first of the two lines.
 std::optional<PropertyList> parseCellMonitorArrayQuietly(const LogRecord& record);
 
-/// A key that shows a cell's number as decimal text. `failure` is logged where the cell has none.
+/// A key that shows a cell's number as decimal text. `failure` is logged if the cell has none.
 constexpr Field cellNumber(std::string_view key, std::string_view cellKey, std::string_view failure,
                            std::string_view meaning = {}) {
     Field field{key, std::nullopt, Conversion::number(), meaning};
@@ -33,8 +33,8 @@ constexpr Field cellNumber(std::string_view key, std::string_view cellKey, std::
     return field;
 }
 
-/// A key that shows a cell's number as a level: the low 16 bits, signed, times `factor`, under
-/// `format`; the empty string for 32767, which stands for "not measured".
+/// A key that shows a cell's number as a level: the low 16 bits, signed, times `factor`, with
+/// `format`. 32767 means "not measured" and is shown as the empty string.
 constexpr Field cellLevel(std::string_view key, std::string_view cellKey, std::string_view failure,
                           const NumberFormat& format, double factor = 1.0,
                           std::string_view meaning = {}) {

@@ -7,12 +7,11 @@
 
 namespace pallax {
 
-/// The reader of the SIM-file record: behind the header of the extended record 0xFF0000 stands a
-/// serialized property list, a dictionary of SIM files. (The name is older than the code.)
+/// Reads the SIM-file record: the payload of the extended record 0xFF0000 is a serialized property
+/// list, a dictionary of SIM files. (The class name is older than the log code.)
 class LogCode_0xFF000020 {
 public:
-    /// Thrown when the property list embedded in the record cannot be parsed. Nothing in the core
-    /// catches it.
+    /// Thrown when the property list in the record cannot be parsed. The core does not catch it.
     class UnknownDataException : public std::exception {
     public:
         const char* what() const noexcept override {
@@ -20,11 +19,11 @@ public:
         }
     };
 
-    /// Throws UnknownDataException, with "SIM File dictionary data could not be constructed" in
-    /// the log, when the payload is no property list.
+    /// Logs "SIM File dictionary data could not be constructed" and throws UnknownDataException
+    /// when the payload is not a property list.
     explicit LogCode_0xFF000020(const LogRecord& record);
 
-    /// What the service sent: a dictionary, unless the payload is another property list.
+    /// The property list that the service sent, normally a dictionary.
     const PropertyList& files() const { return _files; }
 
 private:

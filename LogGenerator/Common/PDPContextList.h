@@ -8,7 +8,7 @@ namespace pallax {
 ///
 ///   0xFF0002: a property list from byte 13 on, an array; the list becomes its elements, unchanged
 ///
-/// A payload that is no array, or no property list at all, changes nothing and is not reported.
+/// A payload that is not an array, or not a property list, is ignored silently.
 class PDPContextList final : public LayoutRecord {
 public:
     PDPContextList();

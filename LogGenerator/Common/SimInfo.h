@@ -24,8 +24,8 @@ namespace pallax {
 ///   kSimFile_OPL               EF-OPERATOR PLMN LIST
 ///   kSimFile_OPLMNAcT          EF-OPLMNAcT
 ///
-/// A file that the service does not send keeps what was shown for it.
-/// Reading throws LogCode_0xFF000020::UnknownDataException when the payload is no property list.
+/// A file that the service does not send keeps its last value.
+/// Reading throws LogCode_0xFF000020::UnknownDataException when the payload is not a property list.
 class SimInfo final : public LayoutRecord {
 public:
     SimInfo();

@@ -14,7 +14,7 @@ constexpr auto kCellFields = std::to_array<Field>({
         .identifying(),
 });
 
-/// They follow the measured neighbours.
+/// The detected cells follow the measured neighbours.
 constexpr auto kLists = std::to_array<ListLayout>({{
     .entries = {{.start = kConnectedModeLength, .stride = kDetectedEntryLength, .bytesRead = 2},
                 EntryRun::Move{kMeasuredEntryLength, u8At(kMeasuredCountOffset)}},

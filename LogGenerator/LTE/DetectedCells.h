@@ -16,8 +16,7 @@ namespace pallax {
 ///   byte  width  key               shown as
 ///   0     16     Physical Cell ID  number
 ///
-/// The size check of MeasuredNeighborCells is not made here: what that one refuses may well fill
-/// this list.
+/// This list has no size check: a record that MeasuredNeighborCells refuses may fill it.
 class DetectedCells final : public LayoutRecord {
 public:
     DetectedCells();

@@ -17,8 +17,8 @@
 
 namespace pallax {
 
-/// The records of the LTE technology. They are created in the order of the members, which is the
-/// order in which the subscribers of one log code are called.
+/// The records of the LTE technology. The order of the members is the order of creation, in which
+/// the subscribers of a log code are called.
 class LTEClassIndex final : public ClassIndex {
 public:
     explicit LTEClassIndex(StandardOutput& standardOutput) : ClassIndex(standardOutput) {}

@@ -9,7 +9,7 @@ namespace pallax {
 
 namespace {
 
-/// By the number of resource blocks.
+/// Indexed by the number of resource blocks.
 constexpr auto kBandwidths = [] {
     std::array<std::string_view, 101> labels{};
     labels.fill("Unknown");
@@ -44,7 +44,7 @@ constexpr auto kIdentityFields = std::to_array<Field>({
     {kBandKey, s32At(28), Conversion::number(), "Number of the E-UTRA operating band."},
 });
 
-/// The cell monitor's, of the cell before.
+/// The cell monitor's value for the previous cell.
 constexpr auto kForeignKeys = std::to_array<std::string_view>({kUarfcnKey});
 
 constexpr auto kAntennasFields = std::to_array<Field>({
@@ -72,7 +72,7 @@ constexpr ListPart kServingCell{
     .cellType = kHXCellMonitorCellTypeServing,
 };
 
-/// Those who read logs expect the line after every antenna report.
+/// Log readers expect this line after every antenna report.
 void logAntennas(const CodeLayout& code, const LogRecord& /*record*/) {
     logUnknownLogCode(code.logCode);
 }

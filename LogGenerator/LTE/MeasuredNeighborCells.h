@@ -18,10 +18,10 @@ namespace pallax {
 ///   2     16     Filtered RSRP     raw x 0.25 - 140, dBm
 ///   4     16     Filtered RSRQ     raw x 0.125 - 20, dB
 ///
-/// A record without entries, or whose low byte of 6 x N is above that of its length less 2 x D, is
-/// refused with a line in the log, and the list stays empty. That only the low bytes are compared
-/// lets some records pass that are too short, whose list then stops at the last whole entry, and
-/// refuses some that are long enough.
+/// A record is refused if N is 0, or if the low byte of 6 x N is above the low byte of its length
+/// less 2 x D: the list is emptied and a line is logged. Because only the low bytes are compared,
+/// some records that are too short pass (their list ends at the last whole entry), and some that
+/// are long enough are refused.
 class MeasuredNeighborCells final : public LayoutRecord {
 public:
     MeasuredNeighborCells();

@@ -49,7 +49,7 @@ constexpr auto kLists = std::to_array<ListLayout>({{
     .plus = 1,
 }});
 
-/// One line for the cell, and one for each of its levels: the values that are no whole numbers.
+/// Logs a line for the cell and one for each level (levels are the fields with fractions).
 void logCell(const LogRecord& cell) {
     systemLog(LogPriority::Warning, "Physical Cell ID: %d\n", cell.read(kPhysicalCellId));
     for (const Field& field : kCellFields) {

@@ -26,9 +26,9 @@ namespace pallax {
 ///   12    0    11     Ant 1 Frame Offset   number
 ///   13    3    19     Ant 1 Sample Offset  number
 ///
-/// Antenna 1 repeats antenna 0. An RSRP step is 0.5 dB here, where the serving cell's is 0.25 dB.
-/// The number of entries that the record claims is logged, and behind it each whole entry's cell
-/// and five levels, all five under the label "Measured RSSI".
+/// Antenna 1 repeats antenna 0. An RSRP step is 0.5 dB here; the serving cell's is 0.25 dB. The
+/// claimed number of entries is logged, then each whole entry's cell and five levels, all five
+/// with the label "Measured RSSI".
 class NeighborCellsList final : public LayoutRecord {
 public:
     NeighborCellsList();

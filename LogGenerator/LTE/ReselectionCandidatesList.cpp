@@ -26,7 +26,7 @@ constexpr Field kCdmaChannel{"Channel", u16At(8), Conversion::number(),
 constexpr Field kCdmaPilot{"Pilot", u16At(10), Conversion::number(),
                            "PN offset of the pilot of a CDMA candidate."};
 
-/// The head, and what follows it by the technology.
+/// The head, then the fields of each technology.
 constexpr auto kCandidateFields = std::to_array<Field>({
     {"Candidate Priority", u16At(0), Conversion::number(),
      "Reselection priority of the candidate."},

@@ -32,8 +32,7 @@ namespace pallax {
 ///   8     0    16     Channel             number
 ///   10    0    16     Pilot               number
 ///
-/// Entries stand 4 bytes apart, so that an entry's technology data is also the head of the entries
-/// behind it.
+/// Entries begin 4 bytes apart, so an entry's technology data overlaps the entries that follow.
 class ReselectionCandidatesList final : public LayoutRecord {
 public:
     ReselectionCandidatesList();

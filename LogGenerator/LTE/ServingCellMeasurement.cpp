@@ -14,7 +14,7 @@ constexpr Conversion kRssi = Conversion::number(kLevelDbm, 0.5, -140.0);
 constexpr Conversion kPowerLimit =
     Conversion::number(kDecimalDbm, 1.0, -30.0).except(64, "Not Present");
 
-/// Of a search threshold; 32 stands for none.
+/// The conversion of a search threshold; 32 means none.
 constexpr Conversion searchThreshold(const NumberFormat& format) {
     return Conversion::number(format, 2.0).except(32, "Not Present");
 }

@@ -28,8 +28,8 @@ namespace pallax {
 ///   32    1    1      Measurement Rules Updated               "True", "False" for 0
 ///   32    2    4      Measurement Rules                       number
 ///
-/// "Max UE Tx Power" is too narrow ever to hold 64, so that it is always shown as a power. The two
-/// search thresholds are of one kind, and yet one is shown in dB and the other in dBm.
+/// "Max UE Tx Power" is too narrow for 64, so it is always shown as a power. The two search
+/// thresholds are of the same kind, but one is shown in dB and the other in dBm.
 class ServingCellMeasurement final : public LayoutRecord {
 public:
     ServingCellMeasurement();

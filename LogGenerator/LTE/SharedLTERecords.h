@@ -5,8 +5,8 @@
 
 #include <cstddef>
 
-/// The log codes that several records of this technology read, with the least length that all of
-/// them ask, the counts that several of them need, and the formats of levels.
+/// Shared by several records of this technology: log codes with their least length, counts, and
+/// the formats of levels.
 namespace pallax {
 
 /// Connected-mode intra-frequency measurement:

@@ -7,11 +7,10 @@
 
 namespace pallax {
 
-/// The technologies that have a generator, in the order in which identifiers are compared.
+/// The technologies that have a generator, in the order in which their identifiers are compared.
 std::span<const Technology> technologies();
 
-/// Whether the technology that looks for its template among all resources, UTRAN, takes the one at
-/// this path for it.
+/// Whether UTRAN, which searches all resources for its template, accepts the one at this path.
 bool isTemplateOfUtran(std::string_view path);
 
 } // namespace pallax

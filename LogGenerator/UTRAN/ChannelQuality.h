@@ -11,8 +11,8 @@
 ///   17 + 2i             2 byte  transport channel i
 ///   289 + 34T + 8i      8 byte  composite channel i
 ///
-/// The composite channels begin at their fixed place, however few bytes the transport channels
-/// take before it.
+/// The composite channels begin at this place even if the transport channels before them take
+/// fewer bytes.
 namespace pallax {
 
 inline constexpr LogCode kChannelQualityLogCode = 0xD00C;

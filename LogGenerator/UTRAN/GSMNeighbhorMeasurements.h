@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// The GSM neighbour cells, section "GSM Neighbor Cell List", which never shows them: a record
-/// empties the section, and the cells that it tells are not shown.
+/// The GSM neighbour cells, section "GSM Neighbor Cell List". A record empties the section; its
+/// cells are read but never shown.
 ///
 ///   0xD00E, at least 17 bytes, little-endian
 ///   byte     bit  width   field

@@ -29,7 +29,7 @@ constexpr auto kFields = std::to_array<Field>({
         .when(kIsKnownVersion),
 });
 
-/// A short record is reported and read all the same.
+/// Reports a short record, but accepts it.
 bool reportsShort(const CodeLayout& /*code*/, const LogRecord& record) {
     if (!record.has(kExpectedLength)) {
         systemLog(LogPriority::Warning, "LogCode_0xD0E0 is length is %ld expected size %ld",

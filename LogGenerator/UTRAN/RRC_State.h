@@ -11,8 +11,8 @@ namespace pallax {
 ///   13    8             record version
 ///   14    8      State  label (kModes), "Unknown RRC Mode" beyond
 ///
-/// Only version 1 is understood; under any other the mode counts as 255. A record shorter than 15
-/// bytes is reported and read all the same. Other codes are ignored silently.
+/// Only version 1 is understood; in other versions the mode counts as 255. A record shorter than
+/// 15 bytes is reported, but still read. Other codes are ignored silently.
 class RRC_State final : public LayoutRecord {
 public:
     RRC_State();

@@ -34,7 +34,7 @@ constexpr RecordLayout kLayout{
     .kind = SectionKind::List,
     .meaning = "Block errors of the transport channels.",
     .codes = kCodes,
-    .priority = LogPriority::Notice, // the one record that notes it
+    .priority = LogPriority::Notice, // unlike all other records
     .reportsOtherCodes = false,
 };
 

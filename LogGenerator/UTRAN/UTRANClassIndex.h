@@ -14,9 +14,8 @@
 
 namespace pallax {
 
-/// The records of the UTRAN technology. They are created in the order of the members, which is
-/// the order in which the subscribers of one log code are called. Its end prints no line of its
-/// own.
+/// The records of the UTRAN technology. The order of the members is the order of creation, in
+/// which the subscribers of a log code are called. Its destruction prints no line.
 class UTRANClassIndex final : public ClassIndex {
 public:
     explicit UTRANClassIndex(StandardOutput& standardOutput) : ClassIndex(standardOutput) {}

@@ -13,12 +13,12 @@ namespace pallax {
 
 namespace {
 
-/// Of the basic Latin letters, whatever the user's locale is.
+/// Converts basic Latin letters, independent of the user's locale.
 constexpr char upperCase(char letter) {
     return letter >= 'a' && letter <= 'z' ? static_cast<char>(letter - 'a' + 'A') : letter;
 }
 
-/// The name under which the resources hold the template; nothing when none of them is one.
+/// The resource name of the template, or nothing if there is none.
 std::optional<std::string> templateName(const Resources& resources) {
     const auto paths = resources.propertyListPaths();
     const auto found = std::find_if(paths.begin(), paths.end(), UTRANLogGenerator::isTemplate);

@@ -34,7 +34,7 @@ constexpr auto kCellFields = std::to_array<Field>({
     cellNumber("Cell Scrambling Code", kHXCellMonitorSCN,
                "Serving Cell Info: Failed to retrieve Cell Scrambling Code\n",
                "Scrambling code of the serving cell."),
-    // The service knows one frequency, not which link it belongs to; its lack is reported once.
+    // The service sends one frequency without its link. If it is missing, this is logged once.
     cellNumber(kUplinkKey, kHXCellMonitorUARFCN, "Serving Cell Info: Failed to retrieve UARFCN\n"),
     cellNumber(kDownlinkKey, kHXCellMonitorUARFCN, ""),
 });

@@ -16,7 +16,7 @@ constexpr std::size_t kCellStride = 15;
 constexpr std::size_t kPathLength = 44;
 constexpr Condition kIsActive{bitsAt(8, 5, 3), 0, 0};
 
-/// Of a path record.
+/// The energies of a path record.
 constexpr auto kEnergies = std::to_array<Extent>({
     extentOf(u32At(32), Extent::Origin::Companion),
     extentOf(u32At(36), Extent::Origin::Companion),
@@ -29,7 +29,7 @@ constexpr auto kEnergiesAndAgc = std::to_array<Extent>({
     extentOf(kReceiveAgc, Extent::Origin::Record),
 });
 
-/// Of the first energy of the path record that is not 0, or of 0.
+/// Ec/Io of the path record's first energy that is not 0, or of 0 if all are 0.
 std::int64_t ecio_db(const LogRecord& path) {
     const auto* const energy =
         std::find_if(kEnergies.begin(), kEnergies.end(),

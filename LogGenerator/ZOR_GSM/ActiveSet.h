@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// The UMTS cells that the phone is connected through, section "Active Set": the searcher's cells
-/// of set type 0, in packet order.
+/// The UMTS cells that connect the phone, section "Active Set": the searcher's cells of set type
+/// 0, in packet order.
 ///
 ///   0x417A, at least 16 bytes, little-endian
 ///   byte             width    field

@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// The cell-change counters, section "Cell Change Counters". No log code is known to carry them:
-/// the section shows, and stays empty.
+/// The cell-change counters, section "Cell Change Counters". No log code is known to carry them,
+/// so the section stays empty.
 class CellChangeCounters final : public LayoutRecord {
 public:
     CellChangeCounters();

@@ -6,7 +6,7 @@ namespace {
 
 constexpr RecordLayout kLayout{
     .section = "Coding Scheme",
-    .logLine = "CellChangeCounters", // the line of the counters, on purpose
+    .logLine = "CellChangeCounters", // the same as the counters, on purpose
     .meaning = "GPRS coding schemes; no log code is known to carry them.",
     .reportsOtherCodes = false,
 };

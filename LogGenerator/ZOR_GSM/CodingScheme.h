@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// The GPRS coding schemes, section "Coding Scheme". No log code is known to carry them: the
-/// section shows, and stays empty.
+/// The GPRS coding schemes, section "Coding Scheme". No log code is known to carry them, so the
+/// section stays empty.
 class CodingScheme final : public LayoutRecord {
 public:
     CodingScheme();

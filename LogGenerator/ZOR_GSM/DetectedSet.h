@@ -5,7 +5,7 @@
 namespace pallax {
 
 /// The UMTS cells that the phone has found by itself, section "Detected Set". The searcher's cell
-/// list empties it and shows nothing in it, whatever set types its cells have.
+/// list empties it; cells of all set types are ignored.
 ///
 ///   0x417A, at least 16 bytes
 ///   byte  width  field

@@ -6,7 +6,7 @@ namespace pallax {
 
 namespace {
 
-/// Where the digits of a code stand: every second byte from the first on.
+/// The positions of a code's digits: every second byte, starting with the first.
 constexpr std::array<Extent, 3> digitsFrom(std::size_t first) {
     return {Extent{first}, Extent{first + 2}, Extent{first + 4}};
 }

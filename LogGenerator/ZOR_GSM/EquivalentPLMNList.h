@@ -16,7 +16,7 @@ namespace pallax {
 ///   0, 2, 4     Mobile Country Code    number: 100 x byte 0 + 10 x byte 2 + byte 4
 ///   1, 3, 5     Mobile Network Code    number: 100 x byte 1 + 10 x byte 3 + byte 5
 ///
-/// So neighbouring entries overlap by three bytes. The bytes are whole digits, none is refused.
+/// Neighbouring entries therefore overlap by three bytes. Each byte is one digit; none is refused.
 class EquivalentPLMNList final : public LayoutRecord {
 public:
     EquivalentPLMNList();

@@ -8,7 +8,7 @@ namespace pallax {
 
 namespace {
 
-/// A label of a table whose first entry is what the byte 255 means.
+/// A label from a table whose first entry is the one for 255.
 constexpr Conversion labelByBytePlusOne(std::span<const std::string_view> labels) {
     return Conversion::label(labels, "Unknown", 1);
 }

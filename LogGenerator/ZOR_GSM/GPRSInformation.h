@@ -36,8 +36,8 @@ namespace pallax {
 ///   0x7135, at least 32 bytes
 ///   13    8      Network Operating Mode     label (kOperatingModes), "Unknown" beyond
 ///
-/// A table by raw + 1 starts with what 255 means, the modem's value for a parameter that is
-/// not present.
+/// Tables by raw + 1 start with the label for 255, the modem's value for a parameter that is not
+/// present.
 class GPRSInformation final : public LayoutRecord {
 public:
     GPRSInformation();

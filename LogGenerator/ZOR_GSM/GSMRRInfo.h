@@ -27,8 +27,8 @@ namespace pallax {
 ///   byte  width  key                 shown as
 ///   16    8      DRX Used            number, sec
 ///
-/// GSMServingCell reads the words at 16 and 20 of 0x5137 by their low halves, unsigned, and under
-/// other names.
+/// GSMServingCell reads the low halves of the words at 16 and 20 of 0x5137, unsigned, and shows
+/// them under other names.
 class GSMRRInfo final : public LayoutRecord {
 public:
     GSMRRInfo();

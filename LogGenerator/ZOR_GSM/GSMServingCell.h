@@ -27,7 +27,8 @@ namespace pallax {
 ///   kHXCellMonitorCellId    Cell ID    number
 ///   kHXCellMonitorARFCN     ARFCN      number
 ///
-/// GSMRRInfo reads the words at 16 and 20 of 0x5137 whole, signed, and under other names.
+/// GSMRRInfo reads the whole words at 16 and 20 of 0x5137, signed, and shows them under other
+/// names.
 class GSMServingCell final : public LayoutRecord {
 public:
     GSMServingCell();

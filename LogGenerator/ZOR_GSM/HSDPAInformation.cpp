@@ -35,7 +35,7 @@ constexpr auto kProcessFields = std::to_array<Field>({
 
 constexpr Position kPrimaryCount = u8At(16);
 constexpr EntryList::Layout kProcesses{.start = 18, .stride = 9, .bytesRead = 9};
-/// By which each primary process moves the secondary ones.
+/// Each primary process moves the secondary ones by this many bytes.
 constexpr std::size_t kPrimaryStride = 162;
 
 constexpr auto kLists = std::to_array<ListLayout>({

@@ -5,7 +5,7 @@
 namespace pallax {
 
 /// The HARQ statistics of the high-speed downlink, section "HSDPA Info". A packet without
-/// processes of a kind leaves the list of that kind as it was.
+/// processes of a kind does not change the list of that kind.
 ///
 ///   0x4221, at least 18 bytes, little-endian
 ///   byte             bit  width   key                     shown as

@@ -12,7 +12,7 @@ namespace pallax {
 ///   14       8                number of channels
 ///   15 + 2i  16     ARFCNs    array of numbers, one for each channel
 ///
-/// The array is a new one after each record.
+/// Each record replaces the array with a new one.
 class MobileAllocation final : public LayoutRecord {
 public:
     MobileAllocation();

@@ -6,15 +6,15 @@
 #include <cstddef>
 #include <string_view>
 
-/// What the mobility-management records share: their log codes, the least length of each, and
-/// the labels that more than one of them shows.
+/// Shared by the mobility-management records: their log codes, their least length, and the labels
+/// that more than one of them shows.
 namespace pallax {
 
 inline constexpr LogCode kGMMStateLogCode = 0x7130;
 inline constexpr LogCode kMMStateLogCode = 0x7131;
 inline constexpr LogCode kRegistrationLogCode = 0x7132;
 
-/// Asked of every state record, also where fewer bytes are read.
+/// Required of every state record, even if fewer bytes are read.
 inline constexpr std::size_t kStateRecordLength = 16;
 
 inline constexpr std::string_view kMMStateKey = "MM State";
@@ -31,7 +31,7 @@ inline constexpr auto kRegistrationStates = std::to_array<std::string_view>({
 });
 static_assert(kRegistrationStates.size() == 7);
 
-/// The gaps are states that the modem does not use; two labels carry a blank inside.
+/// The modem does not use the "Unknown" states; two labels contain a blank.
 inline constexpr auto kMMStates = std::to_array<std::string_view>({
     "MM_NULL",
     "Unknown",
@@ -62,7 +62,7 @@ inline constexpr auto kMMStates = std::to_array<std::string_view>({
 });
 static_assert(kMMStates.size() == 26);
 
-/// Of two of them.
+/// Shown by two of the records.
 inline constexpr Field kMMStateField{kMMStateKey, u8At(13), Conversion::label(kMMStates),
                                      "State of the mobility management entity (MM)."};
 

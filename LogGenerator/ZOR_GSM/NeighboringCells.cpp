@@ -15,7 +15,7 @@ constexpr std::string_view kARFCNKey = "ARFCN";
 constexpr std::string_view kRSSIKey = "RSSI";
 constexpr std::string_view kBSICKey = "BSIC";
 
-/// What the last list of identity codes told for the neighbour's ARFCN.
+/// The code that the last list of identity codes had for the neighbour's ARFCN.
 PropertyList bsicOf(const Place& place) {
     const auto& remembered = place.memory->remembered;
     const auto bsic = remembered.find(place.here.read(kArfcn));
@@ -61,7 +61,7 @@ constexpr auto kBsics = std::to_array<ListLayout>({{
     .rememberedAs = "bsic",
 }});
 
-/// The cell monitor counts levels in steps of this many dBm.
+/// The cell monitor's step of a level.
 constexpr double kRssiStepDbm = 2.0;
 constexpr auto kCellFields = std::to_array<Field>({
     cellNumber(kARFCNKey, kHXCellMonitorARFCN, "NeighboringCells: Failed to retrieve ARFCN\n")

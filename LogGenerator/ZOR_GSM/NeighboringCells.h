@@ -33,7 +33,7 @@ namespace pallax {
 ///   kHXCellMonitorARFCN    ARFCN    number
 ///   kHXCellMonitorRSSI     RSSI     signed x 2, dBm, empty for 32767; of the low 16 bits
 ///
-/// Whichever of 0x5137 and 0xFF0001 came last makes the list.
+/// The list comes from the latest record of 0x5137 and 0xFF0001.
 class NeighboringCells final : public LayoutRecord {
 public:
     NeighboringCells();

@@ -5,7 +5,7 @@
 namespace pallax {
 
 /// The GSM cells that are not ranked, section "Non-Ranked GSM Set". No log code is known to carry
-/// them: the section shows, and stays empty.
+/// them, so the section stays empty.
 class NonRankedGSMSet final : public LayoutRecord {
 public:
     NonRankedGSMSet();

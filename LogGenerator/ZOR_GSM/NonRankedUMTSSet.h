@@ -5,7 +5,7 @@
 namespace pallax {
 
 /// The UMTS cells that are not ranked, section "Non-Ranked UMTS Set". No log code is known to carry
-/// them: the section shows, and stays empty.
+/// them, so the section stays empty.
 class NonRankedUMTSSet final : public LayoutRecord {
 public:
     NonRankedUMTSSet();

@@ -21,7 +21,7 @@ constexpr auto kCodes = std::to_array<CodeLayout>({
 
 constexpr RecordLayout kLayout{
     .section = "Process CO",
-    .logLine = "ProcessCS", // the line of its sibling, on purpose
+    .logLine = "ProcessCS", // the same as ProcessCS, on purpose
     .meaning = "Registration and mobility management as Process CS shows them, without sub-state "
                "and cause.",
     .codes = kCodes,

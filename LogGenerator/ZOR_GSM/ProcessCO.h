@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// The registration state and the mobility-management state, section "Process CO": what ProcessCS
-/// shows of the same records, without sub-state and reject cause.
+/// The registration state and the mobility-management state, section "Process CO": the same as
+/// ProcessCS, without sub-state and reject cause.
 ///
 ///   0x7132, at least 16 bytes
 ///   byte  width  key                 shown as

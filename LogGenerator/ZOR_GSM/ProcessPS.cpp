@@ -27,7 +27,7 @@ constexpr auto kGMMSubStates = std::to_array<std::string_view>({
     "GMM_PLMN_SEARCH",
     "GMM_SUSPENDED",
     "GMM_UPDATE_NEEDED",
-    "GMM_ATTEMPING_TO_UPDATE", // spelled so
+    "GMM_ATTEMPING_TO_UPDATE", // sic
     "GMM_ATTEMPTING_TO_UPDATE_MM",
     "GMM_IMSI_DETACH_INITIATED",
     "GMM_NULL_SUBSTATE",

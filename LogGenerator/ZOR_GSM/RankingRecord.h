@@ -4,8 +4,8 @@
 
 #include <cstddef>
 
-/// What the two sets of the ranking record share. Each has a count of its own, and both lists are
-/// read from the same offset with strides of their own: the two readings overlap, on purpose.
+/// Shared by the two sets of the ranking record. Each set has its own count and stride, but both
+/// lists begin at the same offset: they overlap, on purpose.
 ///
 ///   0x4005, at least 15 bytes
 ///   byte      width    field

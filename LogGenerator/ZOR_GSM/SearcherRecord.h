@@ -4,8 +4,8 @@
 
 #include <array>
 
-/// What the four sets of the UMTS searcher's cell list share: each is a list section that every
-/// accepted packet empties and fills again with the cells it shows.
+/// Shared by the four sets of the UMTS searcher's cell list. Each is a list section, which every
+/// accepted packet empties and refills with the cells that the set shows.
 ///
 ///   0x417A, at least 16 bytes, little-endian
 ///   byte             width    field
@@ -18,7 +18,7 @@ namespace pallax {
 inline constexpr LogCode kSearcherLogCode = 0x417A;
 inline constexpr std::size_t kSearcherRecordLength = 16;
 
-/// Of a set that shows none of the cells.
+/// For the sets that show none of the cells.
 inline constexpr auto kEmptiedSetCodes = std::to_array<CodeLayout>({{
     .logCode = kSearcherLogCode,
     .minimumLength = kSearcherRecordLength,

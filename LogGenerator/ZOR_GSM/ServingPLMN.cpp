@@ -34,7 +34,7 @@ constexpr auto kServiceTypes = std::to_array<std::string_view>({
 });
 static_assert(kServiceTypes.size() == 5);
 
-/// The bytes of the two codes, a digit in each half.
+/// The bytes of the two codes, with two digits in each byte.
 constexpr std::size_t kFirstDigits = 15;
 constexpr std::size_t kSecondDigits = 16;
 constexpr std::size_t kThirdDigits = 17;

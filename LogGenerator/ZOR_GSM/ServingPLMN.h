@@ -28,8 +28,8 @@ namespace pallax {
 ///   kHXCellMonitorMNC    Mobile Network Code    number
 ///   kHXCellMonitorLAC    Location Area Code     number
 ///
-/// Digits above 9 show as a blank: a two-digit network code ends in one when it comes from 0x7135,
-/// and does not when it comes from the cell monitor.
+/// Digits above 9 are shown as a blank. A two-digit network code from 0x7135 therefore ends in a
+/// blank; one from the cell monitor does not.
 class ServingPLMN final : public LayoutRecord {
 public:
     ServingPLMN();

@@ -4,8 +4,8 @@
 
 #include <cstddef>
 
-/// The log codes that several records of this technology read, each its own fields, and the least
-/// length that all of them ask.
+/// The log codes from which several records of this technology read their own fields, with the
+/// least length that all of them require.
 namespace pallax {
 
 /// Serving and neighbour measurements.

@@ -34,7 +34,6 @@ constexpr auto kPowerEntries = std::to_array<ListLayout>({{
     .isShown = false,
 }});
 
-/// Of a raw transmit power, in whole dBm.
 int transmitPower_dbm(std::int64_t raw) {
     constexpr int kRawOffset = 512;
     constexpr int kStepsPerDb = 10;
@@ -44,7 +43,7 @@ int transmitPower_dbm(std::int64_t raw) {
 
 constexpr NumberFormat kMeanDbm{"%4.2lf dBm"};
 
-/// Over the entries that carry a power; not a number when none does.
+/// The mean over the entries with a power; NaN if there are none.
 PropertyList meanTransmitPower(const Place& place) {
     const EntryList entries = kPowerEntries.front().entriesIn(place.here);
     int sum_dbm = 0;
@@ -85,7 +84,7 @@ constexpr auto kIdentityFields = std::to_array<Field>({
     {"URA ID", u16At(25), Conversion::number(), "Identity of the UTRAN registration area."},
 });
 
-/// The cell monitor's, of the cell before.
+/// The cell monitor's value for the previous cell.
 constexpr auto kForeignKeys = std::to_array<std::string_view>({kUarfcnKey});
 
 constexpr auto kCipheringFields = std::to_array<Field>({

@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// The UMTS neighbour cells, section "UMTS Set": those that the phone ranks for reselection, or
-/// those of the cell monitor, whichever came last. The two have different keys and units.
+/// The UMTS neighbour cells, section "UMTS Set": the ranked cells or the cell monitor's cells,
+/// depending on the latest record. The two have different keys and units.
 ///
 ///   0x4005, at least 15 bytes, little-endian
 ///   byte      width    field

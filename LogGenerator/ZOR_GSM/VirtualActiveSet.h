@@ -5,7 +5,7 @@
 namespace pallax {
 
 /// The active set on a frequency that the phone is not on, section "Virtual Active Set". The
-/// searcher's cell list empties it and shows nothing in it, whatever set types its cells have.
+/// searcher's cell list empties it; cells of all set types are ignored.
 ///
 ///   0x417A, at least 16 bytes
 ///   byte  width  field

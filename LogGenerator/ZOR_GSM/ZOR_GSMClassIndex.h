@@ -32,8 +32,8 @@
 
 namespace pallax {
 
-/// The records of the GSM/UMTS technology. They are created in the order of the members, which is
-/// the order in which the subscribers of one log code are called.
+/// The records of the GSM/UMTS technology. The order of the members is the order of creation, in
+/// which the subscribers of a log code are called.
 class ZOR_GSMClassIndex final : public ClassIndex {
 public:
     explicit ZOR_GSMClassIndex(StandardOutput& standardOutput) : ClassIndex(standardOutput) {}
@@ -49,7 +49,7 @@ private:
     std::unique_ptr<PDPContextList> objPDPContextList = create<PDPContextList>();
     std::unique_ptr<ProcessPS> objProcessPS = create<ProcessPS>();
     std::unique_ptr<UMTSRRMeasurement> objUMTSRRMeasurement = create<UMTSRRMeasurement>();
-    // The field is singular, its class is not.
+    // The member's name is singular; its class's is plural.
     std::unique_ptr<CellChangeCounters> objCellChangeCounter = create<CellChangeCounters>();
     std::unique_ptr<DetectedSet> objDetectedSet = create<DetectedSet>();
     std::unique_ptr<GSMSet> objGSMSet = create<GSMSet>();
