@@ -11,7 +11,7 @@ namespace pallax {
 
 namespace {
 
-/// The greatest and the least raw number that stand at a position.
+/// The least and the greatest raw number that fit a position.
 std::pair<double, double> rawRange(const Position& position) {
     const unsigned magnitude = position.isSigned ? position.width - 1 : position.width;
     const double beyond = std::ldexp(1.0, static_cast<int>(magnitude));
@@ -40,7 +40,7 @@ FieldInfo::Kind kindOf(const FieldDescription& field) {
     return field.position ? FieldInfo::Kind::Label : FieldInfo::Kind::Text;
 }
 
-/// What a row tells, added to what other rows of the field have told.
+/// Adds a row to its field.
 void addRow(FieldInfo& info, const FieldDescription& field, LogCode logCode) {
     const Conversion& conversion = field.shownAs;
     if (info.unit.empty() && conversion.format != nullptr) {
@@ -146,7 +146,7 @@ private:
         _isInList = false;
     }
 
-    /// The field of that key here, made if it is the first row of it.
+    /// The field with that key, added at its first row.
     FieldInfo& infoOf(const std::string& key, FieldInfo::Kind kind) {
         std::string name = key.empty() ? _name : _name + "." + fieldWord(key);
         const auto found = std::find_if(_fields.begin(), _fields.end(),
@@ -167,7 +167,8 @@ private:
         return info;
     }
 
-    /// A plain value means what its list does; a list without a key is the section, if that is one.
+    /// A plain value has the meaning of its list; a list without a key is the section, if the
+    /// section is a list.
     std::string_view meaningOf(const std::string& key) const {
         if (key.empty() && _listKey.empty() && _isInList != _section->isList) {
             return {};
@@ -175,7 +176,7 @@ private:
         return _technology.meaningOf(_section->name, key.empty() ? _listKey : key);
     }
 
-    /// The path of the list's entries.
+    /// The path of the entries of the field's list.
     static std::string entryPathOf(const FieldInfo& field) {
         constexpr std::string_view kAnyEntry = "/*";
         return field.path.substr(0, field.path.rfind(kAnyEntry) + kAnyEntry.size());
@@ -200,7 +201,7 @@ private:
     const SectionReference* _section = nullptr;
     std::string _name;
     std::string _path;
-    std::string _listKey; ///< of the list around that has one
+    std::string _listKey; ///< of the innermost list with a key
     std::map<std::string, std::vector<std::string>> _identities; ///< by the path of the entries
     bool _isInList = false;
     bool _isShown = true;

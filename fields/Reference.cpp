@@ -33,7 +33,7 @@ DictionaryRef templateNamed(const Resources& resources, std::string_view name) {
     return entries;
 }
 
-/// The sections of the records, in the order of the template, whatever stands around them.
+/// Appends the sections of the records, at any depth, in the order of the template.
 void appendSections(const Dictionary& entries, const ClassIndex& index, const std::string& around,
                     std::vector<SectionReference>& sections) {
     for (const Dictionary::Entry& entry : entries) {
@@ -77,7 +77,7 @@ std::vector<SectionReference> utranSections(const Resources& resources) {
 /// Maps a lookup name to the keys of one section that show it.
 using Places = std::multimap<std::string, std::string>;
 
-/// The described items that the section shows, under its keys.
+/// The items that the section shows, with its display keys.
 template <class Described>
 std::vector<Described> shownIn(const Places& places, const std::vector<Described>& all) {
     std::vector<Described> shown;
@@ -199,7 +199,7 @@ std::string_view sentenceOf(const std::vector<FieldDescription>& fields,
     return {};
 }
 
-/// The sentence of the section's first row under that key that has one.
+/// The sentence of the section's first row with that key and a sentence.
 std::string_view sentenceOf(const SectionReference& section, std::string_view key) {
     if (key.empty()) {
         return section.meaning;

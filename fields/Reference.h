@@ -20,11 +20,11 @@ struct ObjectKey {
 
 /// One section of a technology's display and its log codes.
 struct SectionReference {
-    std::string name; ///< of CDMA: the path in the template, "1x / Receiver 0"
-    std::string path; ///< of the section in the display: "/1x/Receiver 0"
+    std::string name; ///< CDMA: the path in the template, "1x / Receiver 0"
+    std::string path; ///< in the display: "/1x/Receiver 0"
     bool isList = false;
-    /// Every log code that the section's record subscribes to, even if it shows nothing. The keys
-    /// are display keys, for CDMA too.
+    /// All log codes that the section's record subscribes to, even those that show nothing. The
+    /// keys are display keys, for CDMA too.
     std::vector<CodeDescription> codes = {};
     std::string_view meaning = {}; ///< a sentence
     std::vector<ObjectKey> objectKeys = {};
@@ -41,10 +41,10 @@ struct TechnologyReference {
     std::string_view nameOf(LogCode logCode) const;
 };
 
-/// The descriptions of all technologies, by link type; the sections are in the order of the
+/// The descriptions of all technologies, by link type, with the sections in the order of the
 /// templates in `resources`.
 std::vector<TechnologyReference> gatherReference(const Resources& resources);
-/// The same of one technology, which needs only its own template.
+/// The description of one technology, which needs only its own template.
 TechnologyReference gatherReference(const RecordedTechnology& technology,
                                     const Resources& resources);
 

@@ -6,7 +6,7 @@
 
 namespace pallax {
 
-/// Tells whether the display is current, or a restarted link has left it with old values.
+/// Tells whether the display is current or keeps old values after a restart of the link.
 class DisplayAge {
 public:
     /// New data was shown.
@@ -15,7 +15,7 @@ public:
             _lastShown = now;
         }
     }
-    /// As told to ModelObserver.
+    /// The same arguments as for ModelObserver.
     void generatorChosen(bool keepsDisplay, Time now) {
         if (!keepsDisplay) {
             _left.reset();
@@ -23,7 +23,7 @@ public:
             _left = _lastShown.value_or(now);
         }
     }
-    /// If the values on display are no longer updated: the time of the last update.
+    /// The time of the last update, if the shown values are no longer updated.
     const std::optional<Time>& left() const { return _left; }
 
 private:

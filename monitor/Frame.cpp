@@ -11,16 +11,16 @@ namespace {
 
 using Children = std::vector<NodeRef>;
 
-/// The children of a branch in the frame before, each of which is given once. There may be several
-/// with one name.
+/// The children of a branch in the previous frame, each of which can be taken once. Several may
+/// have the same name.
 class FormerChildren {
 public:
     explicit FormerChildren(const PallaxModelNode* branch)
         : _children(branch != nullptr ? branch->childNodes() : nullptr),
           _isTaken(_children != nullptr ? _children->size() : 0) {}
 
-    /// The child after the one taken last where it has that name, as it mostly has;
-    /// else the first of that name; or null.
+    /// The child after the one taken last, if it has that name (the usual case), or else the first
+    /// one of that name, or null.
     const PallaxModelNode* take(const std::string& name) {
         if (_next < _isTaken.size() && !_isTaken[_next] && nameAt(_next) == name) {
             return takeAt(_next);
@@ -67,18 +67,18 @@ private:
     const Children* _children;
     std::vector<bool> _isTaken;
     std::size_t _next = 0;
-    std::unordered_map<std::string_view, std::vector<std::size_t>> _places; // the first one last
+    std::unordered_map<std::string_view, std::vector<std::size_t>> _places; // in reverse order
 };
 
 } // namespace
 
-/// Walks the trees of two frames side by side, the new one's in display order.
+/// Walks the trees of two frames side by side, in the display order of the new one.
 class Frame::Comparison {
 public:
     Comparison(Frame& frame, const Frame* before, const SectionAges* ages)
         : _frame(frame), _before(before), _ages(ages) {}
 
-    /// `path` is the node's; `readAbove` when the branch above was read.
+    /// `readAbove` is the time at which the branch above was read.
     Stamp node(const PallaxModelNode& now, const PallaxModelNode* before, const std::string& path,
                std::optional<Time> readAbove) {
         const std::optional<Time> own = _ages != nullptr ? _ages->lastRead(path) : std::nullopt;
@@ -124,7 +124,7 @@ private:
         return made;
     }
 
-    /// True when any child of the frame before is left.
+    /// Adds the remaining children to the frame's `gone`. False when there are none.
     bool noteGone(const FormerChildren& former, const std::string& path) {
         const std::vector<std::string_view> names = former.namesLeft();
         for (const std::string_view name : names) {

@@ -17,53 +17,53 @@ namespace pallax {
 
 class SectionAges;
 
-/// An immutable picture of the display at one tick: the tree, what has changed in it since the
-/// frame before, and the age of each value.
+/// An immutable picture of the display at one tick: the tree, the changes since the previous frame,
+/// and the age of each value.
 ///
-/// A frame holds texts and numbers of its own and nothing of the live display, so that any thread
-/// may keep it and read it, without a lock, while the next packets change the display.
+/// A frame owns its texts and numbers and shares nothing with the live display, so any thread may
+/// keep it and read it without a lock while the next packets change the display.
 class Frame {
 public:
     struct Picture {
-        NodeRef root; ///< null where nothing is shown
-        /// Of the root's tree; null where nothing is shown.
+        NodeRef root; ///< null if nothing is shown
+        /// The paths of the root's tree; null if nothing is shown.
         std::shared_ptr<const PathDictionary> paths;
-        Time time; ///< of the display's clock
+        Time time; ///< by the display's clock
     };
 
     struct Stamp {
-        /// When the first frame was made that shows this value; of a branch, when anything below it
-        /// last changed. No later than the first frame of all.
+        /// The time of the first frame that shows this value. For a branch: the last change of a
+        /// node below it.
         Time since;
-        /// When it was last read, changed or not; of a branch without an answer of its own the
-        /// latest below it. Nothing where that is not known.
+        /// When the value was last read, changed or not; nothing if unknown. For a branch without
+        /// a time of its own: the latest time below it.
         std::optional<Time> read;
-        /// Whether it is new, or another than in the frame before. False in the first frame.
+        /// Whether the node is new or differs from the previous frame. False in the first frame.
         bool isChanged = false;
     };
 
-    /// The frame that follows `before`, which is null for the first one. `ages`, which may be null,
-    /// are asked now and never again.
+    /// The frame after `before`, which is null for the first frame. `ages` may be null and is used
+    /// only during this call.
     Frame(Picture picture, const Frame* before, const SectionAges* ages);
     Frame(const Frame&) = delete;
     Frame& operator=(const Frame&) = delete;
 
-    /// From 1.
+    /// Counts from 1.
     std::uint64_t number() const { return _number; }
     Time time() const { return _picture.time; }
     const NodeRef& root() const { return _picture.root; }
-    /// The node that stands at `path` ("/", "/Serving Cell"), or null.
+    /// The node at `path` ("/", "/Serving Cell"), or null.
     NodeRef nodeAtPath(std::string_view path) const;
 
-    /// Of a node of this frame; throws std::out_of_range for any other.
+    /// The stamp of a node of this frame. Throws std::out_of_range for other nodes.
     const Stamp& stamp(const PallaxModelNode& node) const { return _stamps.at(&node); }
-    /// How long ago a node of this frame was last read or, where that is not known, changed.
+    /// How long ago a node of this frame was last read or, if that is unknown, changed.
     std::chrono::nanoseconds age(const PallaxModelNode& node) const;
 
     /// The paths of the leaves that have changed, in display order.
     const std::vector<std::string>& changed() const { return _changed; }
-    /// The paths of the nodes of the frame before that stand here no longer, without those below
-    /// them.
+    /// The paths of the nodes that the previous frame has and this one does not, without those
+    /// below them.
     const std::vector<std::string>& gone() const { return _gone; }
 
 private:
@@ -71,7 +71,7 @@ private:
 
     Picture _picture;
     std::uint64_t _number;
-    std::pmr::monotonic_buffer_resource _storage; // of the stamps, which are as many as the nodes
+    std::pmr::monotonic_buffer_resource _storage; // of the stamps, one for each node
     std::pmr::unordered_map<const PallaxModelNode*, Stamp> _stamps{&_storage};
     std::vector<std::string> _changed;
     std::vector<std::string> _gone;

@@ -24,7 +24,7 @@ const void* address(const MessagePort* port) {
     return port;
 }
 
-/// One request to the modem. Without a port the request fails.
+/// Sends a request to the modem. Fails without a port.
 RemoteMessagePort::Outcome send(RemoteMessagePort* port, const std::string& xml, bool awaitReply) {
     if (port == nullptr) {
         return {SendError::InvalidPort, std::nullopt};
@@ -128,7 +128,7 @@ bool ModemLink::createChannel(const std::string& localPortName) {
     }
     const LogChannel channel =
         connection->HXServerConnectionNetworkMonitorCreateLogChannel(localPortName);
-    connection.reset(); // the channel outlives it
+    connection.reset(); // the channel stays open
     if (channel.errorCode != 0) {
         logError("_HXServerConnectionNetworkMonitorCreateLogChannel returns error: %ld!",
                  channel.errorCode);
@@ -153,7 +153,7 @@ void ModemLink::destroyPorts() {
         _displayUpdateTimer->invalidate();
         _displayUpdateTimer.reset();
     }
-    // The callback goes first: a teardown of our own must not restart the link.
+    // The callback is removed first: our own teardown must not restart the link.
     const auto end = [](auto& port) {
         if (port) {
             port->setInvalidationCallback({});

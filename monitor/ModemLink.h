@@ -18,35 +18,36 @@ class MainQueue;
 class TelephonyService;
 
 /// The owner of a link. It keeps the generator that the link makes, and gets the packets. The link
-/// calls it on the main queue, and is not destroyed by it meanwhile.
+/// calls it on the main queue; it must not destroy the link during a call.
 class ModemLinkClient {
 public:
     virtual ~ModemLinkClient() = default;
-    /// What the modem has answered. A technology that is not wanted counts as no answer.
+    /// Whether to accept the technology that the modem answered. If not, the link treats the answer
+    /// as missing.
     virtual bool wantsTechnology(const PropertyList& /*technology*/) { return true; }
-    /// Replaces the generator; null where no generator knows the technology.
+    /// Replaces the generator; null if no generator knows the technology.
     virtual void setGenerator(std::unique_ptr<LogGenerator> generator) = 0;
     /// The generator that was set last, or null.
     virtual const LogGenerator* generator() const = 0;
-    /// The generator that was set is one for this technology.
+    /// Called after `setGenerator` with the technology of the generator.
     virtual void generatorChosen(const std::string& /*technology*/) {}
-    /// One packet of the log channel. Exceptions leave through the main queue.
+    /// One packet of the log channel. Exceptions pass through the main queue.
     virtual void packetArrived(Bytes packet) = 0;
-    /// Every 2 seconds while the link runs, and when the telephony service tells of a change.
+    /// Called every 2 seconds while the link runs, and when the telephony service reports a change.
     virtual void displayTick() {}
 };
 
 /// The link to the baseband: opens a local port and a log channel, asks the modem for its
-/// technology, makes that technology's generator, sends its start command, and delivers the
-/// packets. Each failure while starting tears the link down; the next start follows 5 seconds
-/// later, forever. A link whose peer ends starts anew at once.
+/// technology, makes the generator, sends its start command, and delivers the packets. A failure
+/// while starting tears the link down; it starts again 5 seconds later, without limit. When the
+/// peer ends, the link restarts at once.
 class ModemLink {
 public:
     static constexpr std::string_view kLocalPortName = "com.norvane.BasebandStateReport.LogChannel";
     static constexpr std::chrono::seconds kDisplayInterval{2};
     static constexpr std::chrono::seconds kRetryDelay{5};
 
-    /// All that it refers to outlives the link.
+    /// The services that the link uses. They must outlive it.
     struct Platform {
         MessagePorts& ports;
         TelephonyService& telephony;
@@ -60,7 +61,7 @@ public:
         Result<std::string, CodecError> (*serialize)(const PropertyList&) = serializeXml;
     };
 
-    /// Starts nothing. The client outlives the link.
+    /// Does not start the link. `client` must outlive it.
     ModemLink(const Platform& platform, ModemLinkClient& client);
     ~ModemLink();
     ModemLink(const ModemLink&) = delete;
@@ -69,22 +70,22 @@ public:
     /// Does nothing while the link runs.
     void startMonitor();
     void restartMonitor();
-    /// False, and logged, when a port, the connection or the channel cannot be had.
+    /// Logs and returns false when a port, the connection or the channel cannot be opened.
     bool createPorts();
     void destroyPorts();
-    /// Asks for the technology and gives the client its generator. After a failure, which is
-    /// logged, the client keeps the generator that it has.
+    /// Asks for the technology and gives the client its generator. Logs a failure, after which the
+    /// client keeps its generator.
     void configureGenerator();
-    /// True while both ports are there.
+    /// True while both ports exist.
     bool isConnected() const;
-    /// Starts the link anew if the modem's port has ended; then the client's display tick.
+    /// Restarts the link if the modem's port has ended, then calls the client's display tick.
     void refresh();
 
 private:
     /// False when any step fails.
     bool start();
     bool createChannel(const std::string& localPortName);
-    /// The technology that the modem answers; null, and logged, when it answers none.
+    /// The technology that the modem answers. Logs and returns null when it answers none.
     PropertyList askTechnology();
     bool sendStartCommand();
     void retryLater();
@@ -93,9 +94,9 @@ private:
     ModemLinkClient& _client;
     std::unique_ptr<LocalMessagePort> _recvPort;
     std::unique_ptr<RemoteMessagePort> _sendPort;
-    /// The link runs while it is there.
+    /// Exists while the link runs.
     std::unique_ptr<RepeatingTimer> _displayUpdateTimer;
-    /// Retries hold it weakly: after the link's end they do nothing.
+    /// Retries hold it weakly, so they do nothing after the link's end.
     std::shared_ptr<ModemLink*> _alive;
 };
 

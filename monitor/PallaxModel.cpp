@@ -42,7 +42,7 @@ void PallaxModel::handOutFrame() {
         return;
     }
     NodeRef root = topLevelNodes();
-    if (_frame && _frame->root() == root) { // two ticks before the queue got here
+    if (_frame && _frame->root() == root) { // the block of an earlier tick made this frame
         return;
     }
     const SectionAges ages = _driver.sectionAges();

@@ -15,7 +15,7 @@
 
 namespace pallax {
 
-/// What the model asks of the application object.
+/// The interface through which the model calls the application object.
 class ModelObserver {
 public:
     virtual ~ModelObserver() = default;
@@ -26,8 +26,8 @@ public:
     virtual void generatorChosen(const std::string& /*technology*/, bool /*keepsDisplay*/) {}
 };
 
-/// The spine of the system: the display model on top of the link to the baseband. It feeds the
-/// link's generator every packet and drives the display refresh every 2 seconds.
+/// The display model on top of the link to the baseband. It gives each packet to the link's
+/// generator and refreshes the display every 2 seconds.
 class PallaxModel final : private ModemLinkClient {
 public:
     static constexpr std::chrono::seconds kDisplayInterval = ModemLink::kDisplayInterval;
@@ -35,13 +35,13 @@ public:
 
     using Platform = ModemLink::Platform;
 
-    /// Starts nothing. The observer outlives the model.
+    /// Does not start the link. `observer` must outlive the model.
     PallaxModel(const Platform& platform, ModelObserver& observer);
     ~PallaxModel() override = default;
     PallaxModel(const PallaxModel&) = delete;
     PallaxModel& operator=(const PallaxModel&) = delete;
 
-    // Those of the link.
+    // The link's operations.
     void startMonitor() { _link.startMonitor(); }
     void restartMonitor() { _link.restartMonitor(); }
     bool createPorts() { return _link.createPorts(); }
@@ -59,15 +59,15 @@ public:
     NodeRef topLevelNodes();
     /// The node at `path` ("/", "/Serving Cell"), or null.
     NodeRef nodeAtPath(std::string_view path);
-    /// The generator's save contents (an array), or null without a generator. The sections of their
-    /// displays are the live ones, which are up to date after a call of `display`.
+    /// The generator's save contents (an array), or null without a generator. Their displays share
+    /// the live sections, which are up to date after a call of `display`.
     PropertyList getSaveContents() const { return _driver.saveContents(); }
-    /// The live display, with every packet that has arrived; null while there is none.
+    /// The live display, up to date with the latest packet; null while there is none.
     PropertyList display() { return _driver.display(); }
 
-    /// As long as the observer lives, it gets the frame of each display tick with new data, after
-    /// the model's observer has been told. The model makes frames only while they are observed, of
-    /// the tree that `topLevelNodes` gives.
+    /// While the observer lives, it gets the frame of each display tick with new data, after the
+    /// model's own observer was called. The model makes frames only while they are observed, from
+    /// the tree of `topLevelNodes`.
     void observeFrames(std::weak_ptr<FrameObserver> observer) {
         _frameObservers.push_back(std::move(observer));
     }
@@ -89,9 +89,9 @@ private:
     NodeRef _nodes;
     std::shared_ptr<const PathDictionary> _nodesByPath;
     std::vector<std::weak_ptr<FrameObserver>> _frameObservers;
-    FrameRef _frame; // that was handed out last
+    FrameRef _frame; // the latest
     ModemLink _link;
-    /// Blocks on the queue hold it weakly: after the model's end they do nothing.
+    /// Blocks on the queue hold it weakly, so they do nothing after the model's end.
     std::shared_ptr<PallaxModel*> _alive;
 };
 

@@ -7,7 +7,7 @@
 
 namespace pallax {
 
-/// Something odd about the stamp of a packet.
+/// An irregularity in the stamp of a packet.
 struct StampRemark {
     enum class Kind {
         StepBack = 1,  ///< it is `size` before the latest stamp: a stretch of time ends
@@ -30,14 +30,14 @@ public:
     /// A longer time without a packet is a gap.
     static constexpr std::chrono::seconds kMostPause{60};
 
-    /// How the next packet would step with this stamp. The first one does not step.
+    /// The step that the next packet would make with this stamp. The first packet makes none.
     std::optional<StampRemark> stepTo(Time stamp) const;
     bool wouldStepBack(Time stamp) const;
     /// Adds the next packet's stamp.
     void take(Time stamp);
 
     bool isEmpty() const { return !_first; }
-    /// Of the present stretch; only after a packet.
+    /// The first stamp of the current stretch; valid only after a packet.
     Time first() const { return *_first; }
     Time latest() const { return _latest; }
 

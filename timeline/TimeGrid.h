@@ -7,9 +7,8 @@
 
 namespace pallax {
 
-/// The times at whole intervals after a first one: number n (from 1) is n intervals later. Computed
-/// directly, without accumulating; nothing overflows in the whole range of Time: a result that Time
-/// cannot hold is Time::max().
+/// The times at whole intervals after a first one: number n (from 1) is n intervals later. Each is
+/// computed directly, without accumulating. Times beyond the range of Time are Time::max().
 class TimeGrid {
 public:
     /// `interval` must be positive.
