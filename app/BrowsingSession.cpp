@@ -55,7 +55,7 @@ PallaxApp::Surroundings BrowsingSession::applicationSurroundings() {
     return surroundings;
 }
 
-/// Without the folder of a recording, for which a title has no room.
+/// Leaves out a recording's folder, which does not fit into a title.
 std::string BrowsingSession::sourceTitle() const {
     return std::filesystem::path(_surroundings.source.name).filename().string();
 }
@@ -86,12 +86,12 @@ void BrowsingSession::startAfresh() {
     if (_surroundings.source.isReadOnce) {
         return _surroundings.face.message("A stream can be played only once");
     }
-    _surroundings.face.note(""); // of what was played until now
+    _surroundings.face.note(""); // removes the note about the old playback
     _app.startAfresh();
 }
 
-/// A signal to the whole process group, which has ended the source, may be on its way to us too: so
-/// the second look counts.
+/// Acts only at the second check: a signal to the whole process group ends the source, and may
+/// reach this process a little later.
 void BrowsingSession::look() {
     if (_surroundings.isSourceGone() && std::exchange(_wasGone, true)) {
         _hasLostSource = true;

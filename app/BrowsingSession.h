@@ -14,32 +14,31 @@ namespace pallax {
 
 class RunLoop;
 
-/// Where the packets come from.
+/// The source of the packets.
 struct BrowsedSource {
-    std::string name; ///< a recording's path, or words
+    std::string name; ///< a recording's path or a description
     bool isReadOnce = false;
 };
 
 /// The application on any front end, from its launch to its end: builds the application object,
-/// looks after its source, and says what happens beside the panes. A front end adds its toolkit,
-/// its input and its drawing.
+/// watches its source, and reports events that the panes do not show. A front end adds its
+/// toolkit, input and drawing.
 class BrowsingSession {
 public:
-    /// Where a front end shows words beside the panes.
+    /// The texts that a front end shows beside the panes.
     struct Face {
-        /// What has just happened.
+        /// Shows an event that has just happened.
         std::function<void(const std::string& text)> message;
-        /// A few words beside the status, from now on; none for an empty text.
+        /// Shows a few words beside the status until the next call; "" removes them.
         std::function<void(const std::string& text)> note;
-        /// What the values come from: what the modem speaks ("" before it is known), and the
-        /// source.
+        /// Shows the modem's technology ("" before it is known) and the source.
         std::function<void(const std::string& technology, const std::string& source)> origin;
-        /// A restarted link has left the values behind, which are from before `time` ("22:13:30");
-        /// with an empty text, they follow the modem.
+        /// Shows that the values are old, last updated at `time` ("22:13:30"), because the link was
+        /// restarted; "" means that they are current.
         std::function<void(const std::string& time)> oldValues;
     };
 
-    /// All that is referred to outlives the session. Queue, timers and loop belong together.
+    /// All references must outlive the session. Queue, timers and loop belong together.
     struct Surroundings {
         ui::Toolkit& toolkit;
         FileSystem& files;
@@ -47,40 +46,40 @@ public:
         MainQueue& queue;
         TimerScheduler& timers;
         RunLoop& loop;
-        const Clock& clock;   ///< of the display
-        const Clock& present; ///< names files
+        const Clock& clock;   ///< for the display
+        const Clock& present; ///< for file names
         PallaxApp::ModelMaker makeModel;
         Face face;
         BrowsedSource source;
         /// Whether the source is gone for good; asked at every `lookInterval`.
         std::function<bool()> isSourceGone = [] { return false; };
         std::chrono::nanoseconds lookInterval = std::chrono::milliseconds(500);
-        std::optional<std::string> snapshotDirectory = {}; ///< instead of the built-in default
-        std::optional<std::string> saveButtonMarker = {};  ///< the same
-        bool startsAfreshByItself = false;                 ///< as PallaxApp::Surroundings
+        std::optional<std::string> snapshotDirectory = {}; ///< replaces the built-in default
+        std::optional<std::string> saveButtonMarker = {};  ///< replaces the built-in default
+        bool startsAfreshByItself = false;                 ///< as in PallaxApp::Surroundings
     };
 
     explicit BrowsingSession(Surroundings surroundings);
-    /// The application terminates as it is to at every exit.
+    /// Terminates the application, which is required at every exit.
     ~BrowsingSession();
     BrowsingSession(const BrowsingSession&) = delete;
     BrowsingSession& operator=(const BrowsingSession&) = delete;
 
-    /// Launches the application. The loop is the caller's: it runs until it is stopped.
+    /// Launches the application. The caller then runs the loop until it is stopped.
     void start();
     /// Launches the application and runs the loop. False when the source was lost.
     bool run();
     /// Stops the loop.
     void quit();
-    /// True when the source was gone at two looks, which has stopped the loop.
+    /// True when the source was gone at two checks; the loop is then stopped.
     bool hasLostSource() const { return _hasLostSource; }
 
-    /// A new model in place of the old one; says so where the source can be read only once.
+    /// Replaces the model with a new one, or shows a message if the source can be read only once.
     void startAfresh();
     bool isConnected() const { return _app.isConnected(); }
 
 private:
-    /// The front end's files; tells where a snapshot went.
+    /// The front end's files; also shows where a snapshot was saved.
     class Files final : public FileSystem {
     public:
         explicit Files(const Surroundings& surroundings) : _surroundings(surroundings) {}
@@ -100,7 +99,7 @@ private:
     Files _files;
     PallaxApp _app;
     std::unique_ptr<RepeatingTimer> _looks;
-    bool _wasGone = false; ///< the source, at an earlier look
+    bool _wasGone = false; ///< the source was gone at an earlier check
     bool _hasLostSource = false;
 };
 

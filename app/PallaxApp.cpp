@@ -174,8 +174,8 @@ void PallaxApp::generatorChosen(const std::string& technology, bool keepsDisplay
     _technology = technology;
     _displayAge.generatorChosen(keepsDisplay, _surroundings.clock.now());
     if (keepsDisplay && _surroundings.startsAfreshByItself) {
-        _surroundings.queue.async(whileAlive(&PallaxApp::startAfresh)); // the model is still
-                                                                        // running
+        // Posted, because the model is still running.
+        _surroundings.queue.async(whileAlive(&PallaxApp::startAfresh));
     } else {
         reportLink();
     }
@@ -195,8 +195,7 @@ NodeRef PallaxApp::nodeOf(const PallaxPaneController& pane, std::size_t index) {
 }
 
 void PallaxApp::reloadPanes() {
-    const auto panes = _navController->screens(); // a copy, because popping changes the stack's own
-                                                  // list
+    const auto panes = _navController->screens(); // a copy, because popping changes the list
     for (std::size_t index = 0; index < panes.size(); ++index) {
         PallaxPaneController& pane = paneOf(*panes[index]);
         NodeRef node = nodeOf(pane, index);

@@ -56,7 +56,7 @@ public:
         LinkChanged linkChanged = {};
     };
 
-    /// Starts nothing.
+    /// Does not launch the application.
     explicit PallaxApp(Surroundings surroundings);
     ~PallaxApp() override;
     PallaxApp(const PallaxApp&) = delete;
@@ -77,7 +77,7 @@ public:
     void showSaveView() override;
     /// Closes it if it is open.
     void closeSaveView();
-    /// Updates the displays that the snapshot screen saves, with every packet that has arrived.
+    /// Brings the displays that the snapshot screen saves up to date with the latest packet.
     void bringUpToDate();
     void updateStatusForViewController(PallaxPaneController& pane);
     /// Reloads every pane, or pops to below the first whose path has vanished, then updates the

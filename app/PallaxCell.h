@@ -17,7 +17,7 @@ class TextMetrics;
 /// layout of its scroll container.
 class PallaxCell final : public ui::TableCell {
 public:
-    /// What a cell was created for.
+    /// The kind of row that a cell was created for.
     enum class Kind {
         /// The key label directly in the content area.
         Branch,

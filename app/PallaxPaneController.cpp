@@ -23,7 +23,7 @@ ui::Label statusLabel(const std::string& status, const ui::TextMetrics& metrics)
     return label;
 }
 
-/// A label that the cell does not have takes no text.
+/// Does nothing if the cell does not have the label.
 void setText(const std::shared_ptr<ui::Label>& label, std::string text) {
     if (label) {
         label->text = std::move(text);

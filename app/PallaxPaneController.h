@@ -15,7 +15,7 @@ class NavigationStack;
 class Toolkit;
 } // namespace ui
 
-/// The application object as panes use it.
+/// The part of the application object that panes use.
 class PaneApplication {
 public:
     virtual ~PaneApplication() = default;
@@ -27,8 +27,8 @@ public:
 };
 
 /// One screen of the navigation stack: a table of the children of one node of the display tree,
-/// under the node's name, above a toolbar with the state of the connection. It fills a toolkit's
-/// roles with what the pane's model says.
+/// with the node's name as title and a toolbar with the state of the connection below. It fills the
+/// toolkit's roles from the pane's model.
 class PallaxPaneController final : public ui::TableScreen, public PaneOwner {
 public:
     /// `node` may be null: no data yet. Toolkit and application must outlive the pane.
@@ -43,7 +43,7 @@ public:
 
     /// A missing status is shown as empty.
     void setStatus(std::optional<std::string> status, bool isLoading);
-    /// As PaneModel::show, whose cursor and filter hold for the new rows.
+    /// As PaneModel::show. The cursor and filter apply to the new rows.
     void reloadWithNode(NodeRef node, std::optional<Time> time = {});
     /// The node's path in the display tree; "/" for the root pane.
     const std::string& path() const { return _pane.path(); }

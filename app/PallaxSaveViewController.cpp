@@ -19,7 +19,7 @@ constexpr const char* kSaveCellIdentifier = "SaveHistoryContentCell";
 constexpr ui::Font kItemFont{ui::FontFace::Helvetica, 13};
 constexpr std::string_view kDescriptionKey = "Description";
 
-/// The entry's "Description"; empty where it has none.
+/// The entry's "Description", or "".
 std::string descriptionOf(const PropertyList& entry) {
     std::string text;
     const DictionaryRef item = entry.dictionary();

@@ -18,8 +18,8 @@ class Clock;
 class FileSystem;
 class MainQueue;
 
-/// The snapshot screen: lists what will be saved and writes it, with a description, as one
-/// property-list file. Its items and its time stamp are those of its creation.
+/// The snapshot screen: lists the items to save and writes them, with a description, as one
+/// property-list file. Its items and time stamp are set when it is created.
 class PallaxSaveViewController final : public ui::ModalScreen, public PaneOwner {
 public:
     /// All references must outlive the screen.
@@ -30,10 +30,10 @@ public:
         const Clock& present; ///< for the file name
         MainQueue& queue;
         std::string snapshotDirectory;
-        /// The application's; posted to the queue, where it may run after the screen is destroyed.
+        /// Closes the screen. Posted to the queue, it may run after the screen is destroyed.
         std::function<void()> closeSaveView;
-        /// Updates the displays that are saved, whose sections are the live ones, with every packet
-        /// that has arrived.
+        /// Brings the saved displays, which share the live sections, up to date with the latest
+        /// packet.
         std::function<void()> bringUpToDate;
     };
 

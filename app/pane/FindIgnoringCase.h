@@ -5,8 +5,7 @@
 
 namespace pallax {
 
-/// Where `wanted` first stands in `text`, ignoring the case of ASCII letters; npos where it does
-/// not.
+/// The position of the first `wanted` in `text`, ignoring the case of ASCII letters, or npos.
 std::size_t findIgnoringCase(std::string_view text, std::string_view wanted);
 
 } // namespace pallax

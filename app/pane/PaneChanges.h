@@ -10,7 +10,7 @@
 
 namespace pallax {
 
-/// Which leaves of a pane have changed, and when. Nothing is compared but the leaves asked about.
+/// Tells which leaves of a pane have changed, and when. Compares only the requested leaves.
 class PaneChanges {
 public:
     struct Change {
@@ -18,26 +18,26 @@ public:
         std::optional<Time> at; ///< as PaneRow::changedAt
     };
 
-    /// The pane shows other data than `before` from now on. `time` is that of the new data.
+    /// Notes that the pane's data `before` was replaced. `time` is the time of the new data.
     void replaced(NodeRef before, std::optional<Time> time);
 
-    /// Of a leaf that stands in that row now. It has changed when the data before had another value
-    /// under its name, or none; as long as there were no data before, nothing has.
+    /// The change of a leaf that is now in that row. It has changed if the previous data had
+    /// another value of that name, or none. Nothing has changed while there is no previous data.
     Change changeOf(const PallaxModelNode& leaf, std::size_t row) const;
 
 private:
     using Times = std::unordered_map<const PallaxModelNode*, Time>;
 
-    /// The child of that name in the data before: looked for in the same row, then by name.
+    /// The child of that name in the previous data, searched in the same row, then by name.
     const PallaxModelNode* namedBefore(std::string_view name, std::size_t row) const;
 
     NodeRef _before;
-    std::optional<Time> _time; ///< of the data now
-    /// The children before, made when a row has moved; of two with one name the later, as a path
-    /// has it. The names belong to the nodes.
+    std::optional<Time> _time; ///< of the current data
+    /// The previous children, filled when a row has moved. Of two with the same name it has the
+    /// later, as PathDictionary does. The nodes own the names.
     mutable std::unordered_map<std::string_view, const PallaxModelNode*> _namesBefore;
-    mutable Times _changed; ///< when the leaves asked about changed, of the data now
-    Times _changedBefore;   ///< and of the data before
+    mutable Times _changed; ///< when the requested leaves changed, for the current data
+    Times _changedBefore;   ///< the same for the previous data
 };
 
 } // namespace pallax

@@ -133,15 +133,15 @@ void PaneModel::arrange() {
     findCursor();
 }
 
-/// Where there is no row for now, the last one's name is kept: it may come back.
+/// While there is no row, keeps the last row's name, because that row may return.
 void PaneModel::rememberCursor() {
     if (const auto row = cursorRow()) {
         _cursorName = children()[*row]->displayName();
     }
 }
 
-/// Mostly the row is where it was. Otherwise the nearest one of that name is taken, and where
-/// there is none any more, the cursor stays at its place.
+/// Usually the row has not moved. Otherwise the cursor moves to the nearest row of that name, or
+/// stays in place if there is none.
 void PaneModel::findCursor() {
     const std::size_t count = shownRows();
     const auto isIt = [this, count](std::size_t shown) {

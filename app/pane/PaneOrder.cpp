@@ -11,7 +11,7 @@ namespace pallax {
 
 namespace {
 
-/// What a row is compared by.
+/// The properties by which rows are compared.
 struct OrderKey {
     enum class Kind { Number, Text, None };
 

@@ -7,23 +7,23 @@
 
 namespace pallax {
 
-/// How the rows of a pane are put in order.
+/// How the rows of a pane are sorted.
 struct PaneOrder {
     enum class By {
-        Display, ///< as the display has them
+        Display, ///< in the display's order
         Name,    ///< by the bytes of the name
-        Value,   ///< numbers by their size, then other texts by their bytes, then branches
+        Value,   ///< numbers, then other texts by their bytes, then branches
     };
 
     By by = By::Display;
-    /// The greatest first; texts still follow numbers, and branches both. Rows that are equal keep
-    /// the display's order.
+    /// Greatest first, but numbers still come before texts and texts before branches. Equal rows
+    /// keep the display's order.
     bool isDescending = false;
 
     bool operator==(const PaneOrder&) const = default;
 };
 
-/// Puts rows, given as places among `children`, in that order; they are in the display's before.
+/// Sorts rows, which are indices into `children` in the display's order.
 void putInOrder(std::vector<std::size_t>& rows, const std::vector<NodeRef>& children,
                 const PaneOrder& order);
 

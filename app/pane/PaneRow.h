@@ -14,17 +14,17 @@ namespace pallax {
 struct PaneRow {
     std::string name;
     std::optional<std::string> text; ///< the value of a leaf
-    /// The number that the text shows, in `unit`; a whole one beyond 2^53 is rounded. Nothing where
-    /// the value is a text of its own.
+    /// The number that the text shows, in `unit`; integers beyond 2^53 are rounded. Nothing if the
+    /// value is not a number.
     std::optional<double> number;
-    std::string_view unit;               ///< "dBm"; empty for none. Lives as long as the program
-    std::optional<std::size_t> elements; ///< of a branch that is a list: how many
+    std::string_view unit;               ///< "dBm", or empty. Lives as long as the program
+    std::optional<std::size_t> elements; ///< as `elementsOf`
     bool isBranch = false;
-    /// A leaf whose value is another than in the data that the pane showed before.
+    /// Whether a leaf's value differs from the pane's previous data.
     bool hasChanged = false;
-    /// The time of the data that brought a leaf's present value; the value's age counts from here.
-    /// Nothing where the pane does not know it: the value was in the pane's first data, the data
-    /// had no time, or the row was not asked for every time that new data had come.
+    /// The time of the data in which a leaf got its current value. Nothing if the pane does not
+    /// know it: the value was in the pane's first data, the data had no time, or the row was not
+    /// requested after each change of the data.
     std::optional<Time> changedAt;
     /// As PallaxModelNode::readAt.
     std::optional<Time> readAt;
@@ -33,12 +33,12 @@ struct PaneRow {
 /// The value of a leaf as text; nothing for a branch.
 std::optional<std::string> textOf(const PallaxModelNode& node);
 
-/// The number that a leaf's text shows; nothing for a branch, and where it shows none.
+/// The number that a leaf's text shows; nothing for a branch or any other text.
 std::optional<double> numberOf(const PallaxModelNode& node);
 
-/// How many elements a branch has that is a list. It counts as one when its children are named "0",
-/// "1", ... in order, at least one: the tree names the elements of an array so, and keeps no other
-/// trace of it.
+/// The number of elements if the branch is a list. A branch counts as a list when it has children,
+/// named "0", "1", ... in order: the tree gives these names to the elements of an array, and does
+/// not mark arrays in another way.
 std::optional<std::size_t> elementsOf(const PallaxModelNode& node);
 
 } // namespace pallax

@@ -74,8 +74,8 @@ public:
     /// The value of a leaf: a string or display number (which knows its number and unit); null for
     /// a branch. Valid as long as the node.
     virtual const PropertyList* value() const { return nullptr; }
-    /// When a packet last gave the value of a leaf, the same one as before or another. Nothing for
-    /// a branch, and where the display does not keep it.
+    /// When the value of a leaf was last read from a packet, changed or not. Nothing for a branch,
+    /// and if the display does not keep it.
     virtual std::optional<Time> readAt() const { return std::nullopt; }
 
     /// Builds the tree of a display object; its root is named "Pallax" and has the path "/". Fills

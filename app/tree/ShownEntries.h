@@ -9,8 +9,8 @@
 
 namespace pallax {
 
-/// An entry of a display dictionary as a row: its name, key and value. They belong to the
-/// dictionary and are valid until its next change.
+/// An entry of a display dictionary as a row. Its members refer to the dictionary and are valid
+/// until its next change.
 struct ShownEntry {
     std::string_view name;
     const Text* key;
