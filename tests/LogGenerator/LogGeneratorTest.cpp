@@ -34,7 +34,7 @@ protected:
     Dictionary state;
 };
 
-/// A state with every value that a history entry copies.
+/// A state with all values that a history entry copies.
 Dictionary fullState() {
     return Dictionary{
         {"Template", Dictionary{{"GSM", "x"}}},

@@ -16,7 +16,7 @@ using doubles::Record;
 using doubles::RecordingLog;
 using Lines = std::vector<RecordingLog::Line>;
 
-/// Shows the length of what it gets; throws where the first payload byte is 0xEE.
+/// Accepts every record, and throws if the first payload byte is 0xEE.
 bool throwsOnMark(const CodeLayout& /*code*/, const LogRecord& record) {
     if (record.u8(LogRecord::kHeaderLength) == 0xEE) {
         throw ArrayOutOfBoundsException();
@@ -87,7 +87,7 @@ protected:
         _lines = log.take();
     }
     PropertyList display() { return _generator.display(_state); }
-    /// As the last look at it left it.
+    /// The display without bringing it up to date.
     PropertyList lastDisplay() { return *_state.find("Display"); }
 
     GeneratorFixture _fixture;
@@ -150,7 +150,7 @@ TEST_F(ZORLogGenerator2Test, APrefixedMessageIsDispatchedUnderTheCodeInItsBytes5
 }
 
 TEST_F(ZORLogGenerator2Test, ARecordOfExactly12BytesIsDropped) {
-    feed(Record(0x4116).bytes()); // the display is there
+    feed(Record(0x4116).bytes()); // the display is built
     feed({0x81, 0x00, 0x01, 0, 0, 0x16, 0x41, 0, 0, 0, 0, 0, 0, 0});
     EXPECT_EQ(_lines,
               (Lines{{6, "Log Header 0x81"}, {4, "Invalid data packet len=12 expected=13"}}));
@@ -186,7 +186,7 @@ TEST_F(ZORLogGenerator2Test, APacketIsCapturedExactlyAsReceived) {
     const ByteBuffer unwanted = Record(0x4117).bytes();
     feed(prefixed);
     feed(unwanted);
-    feed({0x01, 0x02}); // too short for a record, captured all the same
+    feed({0x01, 0x02}); // too short for a record, but captured
     (void)_generator.generateLogUsingState(_state);
     ByteBuffer expected = prefixed;
     expected.insert(expected.end(), unwanted.begin(), unwanted.end());
@@ -236,7 +236,7 @@ TEST_F(ZORLogGenerator2Test, ARecordThatThrowsDoesSoAtOnceAndTheKeptOnesAreShown
     _generator.updateState(_state, Record(0x4116).padTo(40).bytes());
     EXPECT_THROW(_generator.updateState(_state, Record(0x4116).u8(0xEE).bytes()),
                  ArrayOutOfBoundsException);
-    EXPECT_EQ(display(), kShownOfTheLatest) << "of both, for the throw has kept it from the second";
+    EXPECT_EQ(display(), kShownOfTheLatest) << "both; the exception kept it from the second record";
 }
 
 TEST_F(ZORLogGenerator2Test, SubscribedCodesBecomeTheStartCommand) {

@@ -14,7 +14,7 @@ using doubles::RecordingLog;
 using doubles::sameInOrder;
 using Lines = std::vector<RecordingLog::Line>;
 
-/// A generator with nothing but a capture.
+/// A generator that only captures.
 class Capturing final : public ZORLogGenerator {
 public:
     using ZORLogGenerator::ZORLogGenerator;
@@ -119,7 +119,7 @@ TEST_F(ZORLogGeneratorTest, SaveContentsAreTheHistoryEntriesAndTheDlf) {
     EXPECT_EQ(contents[0], entryWith({1, 2}));
     EXPECT_EQ(contents[1], entryWith({3}));
     EXPECT_EQ(*contents[2].dictionary()->find("Description"), "DLF binary (162 bytes)");
-    EXPECT_EQ(state.find("History")->array()->size(), 2U) << "the history itself stays";
+    EXPECT_EQ(state.find("History")->array()->size(), 2U) << "the history itself is unchanged";
 }
 
 TEST_F(ZORLogGeneratorTest, TheCaptureIsHandedOverAndStartsEmpty) {

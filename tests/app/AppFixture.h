@@ -13,8 +13,8 @@
 
 namespace pallax::doubles {
 
-/// Shows what the state holds, and saves the history: as the object-stream modem's generator,
-/// it adds no log of its own. Under the name "History" in `kHistoryTechnologies`.
+/// Shows the state's content and saves the history. Like the generator of the object-stream modem,
+/// it saves no DLF log. Its name in `kHistoryTechnologies` is "History".
 class HistoryGenerator final : public FakeGenerator {
 public:
     explicit HistoryGenerator(const GeneratorEnvironment& environment)
@@ -44,17 +44,17 @@ private:
 
 inline constexpr Technology kHistoryTechnologies[] = {{"History", &HistoryGenerator::generator}};
 
-/// The application over a real model, among fakes; the modem answers "Fake" at first.
+/// The application with a real model and fakes; the modem first answers "Fake".
 class AppFixture : public ModelFixture {
 protected:
-    AppFixture() { model.reset(); } // the application makes its own
+    AppFixture() { model.reset(); } // the application makes its own model
 
     void SetUp() override {
         ModelFixture::SetUp();
         makeApp();
     }
 
-    /// With the settings as they stand.
+    /// Uses the current settings.
     void makeApp() {
         PallaxApp::Surroundings surroundings{
             .toolkit = toolkit,
@@ -79,14 +79,14 @@ protected:
         app->applicationDidFinishLaunching();
         queue.runReady();
     }
-    /// One packet, which changes the display to `display`, and the next tick.
+    /// Receives a packet that changes the display to `display`, up to the next tick.
     void tick(const PropertyList& display) {
         ports.deliver({1});
         queue.runReady();
         generator().display = display;
         advance(PallaxModel::kDisplayInterval);
     }
-    /// The clock moves first, so that what falls due finds the time it is due at.
+    /// Advances the clock first, so that timers see the time at which they are due.
     void advance(std::chrono::nanoseconds duration) {
         clock.advance(duration);
         present.advance(duration);

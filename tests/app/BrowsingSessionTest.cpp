@@ -16,12 +16,12 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using namespace std::chrono_literals;
 
-/// A session on a loop of its own, over a real model among fakes.
+/// A session on its own loop, with a real model and fakes.
 class BrowsingSessionTest : public ModelFixture {
 protected:
     using Face = std::vector<std::string>;
 
-    BrowsingSessionTest() { model.reset(); } // the session makes its own
+    BrowsingSessionTest() { model.reset(); } // the session makes its own model
 
     void SetUp() override {
         ModelFixture::SetUp();
@@ -63,7 +63,7 @@ protected:
                                   .technologies = kFakeTechnologies},
             application);
     }
-    /// One packet, which changes the display; the next tick shows it.
+    /// Receives a packet that changes the display; the next tick shows it.
     void receive(const PropertyList& display) {
         ports.deliver({1});
         generator().display = display;
@@ -189,7 +189,7 @@ TEST_F(BrowsingSessionTest, ASourceThatIsGoneAtTwoLooksEndsIt) {
     queue.after(700ms, [this] { isSourceGone = true; });
     EXPECT_FALSE(session->run());
     EXPECT_TRUE(session->hasLostSource());
-    EXPECT_EQ(queue.now(), 1500ms) << "gone at 1000 ms, and still at 1500 ms";
+    EXPECT_EQ(queue.now(), 1500ms) << "gone at 1000 ms and at 1500 ms";
 }
 
 TEST_F(BrowsingSessionTest, AQuitBetweenTheLooksIsNoLoss) {
@@ -204,7 +204,7 @@ TEST_F(BrowsingSessionTest, ItsEndSwitchesTheHomeScreenPreferenceOff) {
     session.reset();
     EXPECT_EQ(preferences.diary.size(), 3U);
     EXPECT_FALSE(ports.local());
-    queue.advance(10s); // nothing is left that would run
+    queue.advance(10s); // nothing is left to run
 }
 
 } // namespace

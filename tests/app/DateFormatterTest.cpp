@@ -31,7 +31,7 @@ TEST(DateFormatter, TheTimeIsLocal) {
               "Updated 2023-11-13 at 23:59:59");
 }
 
-/// In force at even seconds only.
+/// A zone that is one hour ahead at even seconds only.
 class LeapingZone final : public Clock {
 public:
     Time now() const override { return {}; }

@@ -11,7 +11,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using namespace std::chrono_literals;
 
-/// What the application tells of the link, and how it starts afresh.
+/// How the application reports the link and starts afresh.
 class PallaxAppLinkTest : public AppFixture {
 protected:
     using Reports = std::vector<std::string>;
@@ -50,7 +50,7 @@ protected:
 TEST_F(PallaxAppLinkTest, TheTechnologyIsToldWhenItIsKnown) {
     EXPECT_EQ(reports, Reports{"Fake"});
     restartLink();
-    EXPECT_EQ(reports, (Reports{"Fake", "Fake"})) << "nothing was shown before";
+    EXPECT_EQ(reports, (Reports{"Fake", "Fake"})) << "no values were shown before";
 }
 
 TEST_F(PallaxAppLinkTest, ARestartedLinkLeavesValuesFromTheLastTickBehind) {
@@ -62,8 +62,7 @@ TEST_F(PallaxAppLinkTest, ARestartedLinkLeavesValuesFromTheLastTickBehind) {
     tick(Dictionary{});
     advance(4s);
     restartLink();
-    EXPECT_EQ(reports.back(), "Fake, from 2023-11-14 22:13:22 +0000")
-        << "they are as old as before";
+    EXPECT_EQ(reports.back(), "Fake, from 2023-11-14 22:13:22 +0000") << "their age is unchanged";
     EXPECT_EQ(depth(), 1U);
 }
 
@@ -78,7 +77,7 @@ TEST_F(PallaxAppLinkTest, StartingAfreshMakesANewModelWithAnEmptyState) {
     EXPECT_EQ(rowsOf(top()), "");
     EXPECT_EQ(top().title(), "Pallax");
     EXPECT_EQ(statusOf(top()), "Connecting (loading)");
-    EXPECT_FALSE(appModel->isConnected()) << "the first screen is drawn before";
+    EXPECT_FALSE(appModel->isConnected()) << "the first screen is drawn first";
     EXPECT_EQ(FakeGenerator::living.size(), 0U);
     queue.runReady();
     EXPECT_TRUE(appModel->isConnected());
@@ -96,11 +95,11 @@ TEST_F(PallaxAppLinkTest, StartingAfreshIsPossibleAtAnyMoment) {
     const std::size_t connected = starts();
     telephony.reachable = false;
     restartLink();
-    app->startAfresh(); // while the former model waits for its retry
+    app->startAfresh(); // while the old model waits for its retry
     queue.runReady();
     EXPECT_EQ(starts(), connected + 2);
     advance(PallaxModel::kRetryDelay);
-    EXPECT_EQ(starts(), connected + 3) << "one model tries again";
+    EXPECT_EQ(starts(), connected + 3) << "only one model retries";
     telephony.reachable = true;
     advance(PallaxModel::kRetryDelay);
     EXPECT_TRUE(appModel->isConnected());
@@ -108,7 +107,7 @@ TEST_F(PallaxAppLinkTest, StartingAfreshIsPossibleAtAnyMoment) {
     EXPECT_EQ(rowsOf(top()), "SIM=1");
 
     app->applicationWillTerminate();
-    app->startAfresh(); // there is nothing left to start
+    app->startAfresh(); // nothing to start
     queue.runReady();
     EXPECT_EQ(app->navigationController()->screens().size(), 1U);
 }
@@ -135,14 +134,14 @@ TEST_F(PallaxAppLinkTest, AnOpenSnapshotScreenKeepsWhatItHolds) {
 TEST_F(PallaxAppLinkTest, TheSettingStartsAfreshWhereAReconnectWouldLeaveOldValues) {
     makeApp(true);
     restartLink();
-    EXPECT_EQ(reports, (Reports{"Fake", "Fake", "Fake"})) << "nothing was shown before";
+    EXPECT_EQ(reports, (Reports{"Fake", "Fake", "Fake"})) << "no values were shown before";
     browse();
     reports.clear();
     toolkit.take();
     restartLink();
     EXPECT_EQ(modelsMade(), 1);
     EXPECT_TRUE(appModel->isConnected());
-    EXPECT_EQ(reports, (Reports{"", "Fake"})) << "old values are never told of";
+    EXPECT_EQ(reports, (Reports{"", "Fake"})) << "old values are not reported";
     EXPECT_EQ(depth(), 1U);
     tick(Dictionary{{"SIM", "new"}});
     EXPECT_EQ(rowsOf(top()), "SIM=new");

@@ -14,7 +14,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using namespace std::chrono_literals;
 
-/// Writes as a disk does: what is kept are the bytes of the moment.
+/// Keeps a file's bytes when it is written, like a disk.
 class XmlFiles final : public FileSystem {
 public:
     std::map<std::string, std::string> files;
@@ -134,7 +134,7 @@ TEST_F(SaveViewTest, CancelClosesTheScreenAndWritesNothing) {
     launchWith(kHistoryTechnologies, "History");
     app->showSaveView();
     app->saveViewController()->cancelPressed();
-    EXPECT_NE(app->saveViewController(), nullptr) << "only after the action has returned";
+    EXPECT_NE(app->saveViewController(), nullptr) << "closes only after the action has returned";
     queue.runReady();
     EXPECT_EQ(app->saveViewController(), nullptr);
     EXPECT_TRUE(disk.files.empty());
@@ -164,7 +164,7 @@ TEST_F(SaveViewTest, TheSnapshotScreenDoesNotFollowNewData) {
     app->showSaveView();
     tick(Dictionary{{"SIM", "out"}});
     EXPECT_EQ(app->saveViewController()->numberOfRows(), 1U);
-    EXPECT_EQ(rowsOf(top()), "SIM=out") << "the pane below does";
+    EXPECT_EQ(rowsOf(top()), "SIM=out") << "the pane below is updated";
 }
 
 TEST_F(SaveViewTest, WithoutAGeneratorTheFileHoldsTheTimestampOnly) {
@@ -295,11 +295,11 @@ protected:
         resources.add(name, propertyListFile(PALLAX_SOURCE_DIR "/resources/" + name + ".plist"));
         launchWith(technologies(), GetParam().identifier);
     }
-    /// A message as the log channel delivers it, told apart by `mark`.
+    /// A message from the log channel, identified by `mark`.
     static ByteBuffer message(unsigned mark) {
         return Record(GetParam().logCode).padTo(60).u8(mark).prefixed();
     }
-    /// Ten ticks, the n-th (from 1) with n messages; what the last five ticks captured.
+    /// Runs ten ticks; tick n (from 1) has n messages. Returns the captures of the last five.
     std::vector<ByteBuffer> tenTicks() {
         std::vector<ByteBuffer> captures;
         unsigned mark = 0;

@@ -9,7 +9,7 @@ using namespace std::chrono_literals;
 constexpr const char* kMarker =
     "/NorvaneInternal/Library/PreferenceBundles/Carrier Settings.bundle";
 
-/// Notes what it is asked in the diary of the screens.
+/// Notes its requests in the diary of the screens.
 class NotingFiles final : public FileSystem {
 public:
     explicit NotingFiles(ScreenDiary& diary) : _diary(diary) {}
@@ -27,7 +27,7 @@ private:
 
 class PallaxAppTest : public AppFixture {
 protected:
-    /// What is left of the application object, as a line of a diary.
+    /// The remaining parts of the application object, as a line of a diary.
     std::string remains() const {
         return "message=" + truth(app->updateMessage().has_value()) +
                " saveView=" + truth(app->saveViewController() != nullptr) +
@@ -79,7 +79,7 @@ TEST_F(PallaxAppTest, TheQueuedCallIsTheModelsRestart) {
     appModel->startMonitor();
     ASSERT_EQ(starts(), 1U);
     queue.runReady();
-    EXPECT_EQ(starts(), 2U) << "a mere start would leave a running monitor alone";
+    EXPECT_EQ(starts(), 2U) << "a plain start would not restart a running monitor";
 }
 
 TEST_F(PallaxAppTest, AnApplicationThatIsGoneIsNotStarted) {
@@ -159,7 +159,7 @@ TEST_F(PallaxAppTest, TheNoticeIsPostedThoughTheDomainCouldNotBeSynchronized) {
 }
 
 TEST_F(PallaxAppTest, EveryExitSwitchesTheGSMSignalStrengthOff) {
-    app->applicationWillTerminate(); // even one before the launch
+    app->applicationWillTerminate(); // also before the launch
     EXPECT_EQ(*preferences.domain("com.norvane.plinthe").find("PLShowGSMRSSI"),
               PropertyList::boolean(false));
     makeApp();
@@ -175,7 +175,7 @@ TEST_F(PallaxAppTest, NothingEverSwitchesTheGSMSignalStrengthOn) {
     EXPECT_EQ(preferences.diary, Diary{});
 }
 
-/// Looks at the application whenever a preference is written.
+/// Notes the application's parts when a preference is written.
 class WitnessPreferences final : public Preferences {
 public:
     WitnessPreferences(ScreenDiary& diary, std::function<std::string()> remains)
@@ -193,7 +193,7 @@ private:
     std::function<std::string()> _remains;
 };
 
-/// Looks at the application when it is taken off the screen and when it is released.
+/// Notes the application's parts when it is hidden and when it is released.
 class WitnessWindow final : public ui::Window {
 public:
     WitnessWindow(ScreenDiary& diary, std::function<std::string()> remains)
@@ -224,7 +224,7 @@ TEST_F(PallaxAppTest, ShutdownGoesInItsOrder) {
         toolkit.take(),
         (ScreenDiary{"set PLShowGSMRSSI=false message=true saveView=true window=true ports=true",
                      "window takeOffScreen message=false saveView=false window=true ports=true",
-                     // The field is empty by the time the window itself ends.
+                     // The application clears the field before the window is destroyed.
                      "window released message=false saveView=false window=false ports=true"}));
     EXPECT_EQ(remains(), "message=false saveView=false window=false ports=false");
 }

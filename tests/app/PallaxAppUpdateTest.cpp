@@ -20,7 +20,7 @@ protected:
         AppFixture::SetUp();
         launch();
     }
-    /// Root, "Cells" and "Serving" on top of each other.
+    /// Opens "Cells" and "Serving" above the root.
     void browseThreeLevels() {
         tick(threeLevels("1"));
         openRow("Cells");
@@ -28,7 +28,7 @@ protected:
         ASSERT_EQ(depth(), 3U);
         toolkit.take();
     }
-    /// The link is lost and cannot be made again.
+    /// Loses the link, which then cannot be restored.
     void disconnect() {
         telephony.reachable = false;
         ports.endLocal();
@@ -70,7 +70,7 @@ TEST_F(PallaxAppUpdateTest, ABranchThatDisappearsPopsToThePaneBelowTheFirstVanis
     const ScreenDiary diary = toolkit.take();
     EXPECT_EQ(count(diary, "stack popTo 0 animated=true"), 1U);
     EXPECT_EQ(count(diary, "table 1 reloadData"), 1U);
-    EXPECT_EQ(count(diary, "table 2 reloadData"), 0U) << "the walk stops there";
+    EXPECT_EQ(count(diary, "table 2 reloadData"), 0U) << "the update stops there";
     EXPECT_EQ(count(diary, "table 3 reloadData"), 0U);
 }
 
@@ -97,7 +97,7 @@ TEST_F(PallaxAppUpdateTest, ThePanesKeepTheOldTreeUntilTheyAreReloaded) {
     ports.deliver({1});
     queue.runReady();
     generator().display = threeLevels("2");
-    appModel->refresh(); // the tree is dropped, the update only posted
+    appModel->refresh(); // the tree is dropped, but the update only posted
     EXPECT_EQ(rowsOf(top()), "Power=1");
     queue.runReady();
     EXPECT_EQ(rowsOf(top()), "Power=2");
@@ -175,7 +175,7 @@ TEST_F(PallaxAppUpdateTest, UpdateStatusGivesAPaneTheMessageOrConnecting) {
 
 TEST_F(PallaxAppUpdateTest, BetweenConnectingAndTheFirstDataThePaneSaysConnectingWithDots) {
     app->navigationControllerWillShow(stack(), top(), false);
-    EXPECT_EQ(statusOf(top()), "Connecting...") << "connected: the message, and no spinner";
+    EXPECT_EQ(statusOf(top()), "Connecting...") << "connected: the message, without a spinner";
 }
 
 TEST_F(PallaxAppUpdateTest, ADisplayThatIsNullLeavesTheRootPaneEmpty) {

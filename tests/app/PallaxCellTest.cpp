@@ -18,7 +18,7 @@ constexpr ui::Font kRegular15{ui::FontFace::System, 15};
 
 class PallaxCellTest : public testing::Test {
 protected:
-    /// A leaf cell with "key" of 60 x 18 and "value" of 90 x 20 points, laid out.
+    /// A leaf cell after layout, with "key" of 60 x 18 and "value" of 90 x 20 points.
     std::unique_ptr<PallaxCell> leaf(const Rect& bounds) {
         auto made = make(PallaxCell::Kind::Leaf, bounds);
         made->key()->text = "key";
@@ -37,7 +37,7 @@ protected:
         return made;
     }
 
-    /// Of "key" and "value" in the tests; the row needs 60 + 10 + 50 + 90 = 210 points.
+    /// The extents of "key" and "value"; the row needs 60 + 10 + 50 + 90 = 210 points.
     void SetUp() override { metrics.extents = {{"key", {60, 18}}, {"value", {90, 20}}}; }
 
     FakeTextMetrics metrics;

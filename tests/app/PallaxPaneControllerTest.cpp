@@ -15,7 +15,7 @@ protected:
         return treeNode(std::move(name),
                         {leafNode("ARFCN", "17"), treeNode("Neighbours", {leafNode("0", "21")})});
     }
-    /// A pane over `section`, on a stack; row 0 is a leaf, row 1 a branch.
+    /// A pane of `section` on a stack; row 0 is a leaf, row 1 a branch.
     PaneRef shownPane() {
         PaneRef pane = makePane(section("Serving Cell"), "/Serving Cell");
         putOnStack(pane);

@@ -25,7 +25,7 @@ PropertyList entry(const char* description) {
                       {"Description", description}};
 }
 
-/// Notes each log line among what is done on the screen.
+/// Notes log lines in the diary of the screen.
 class DiaryLog final : public LogSink {
 public:
     explicit DiaryLog(ScreenDiary& diary) : _diary(diary) {
@@ -268,7 +268,7 @@ TEST_F(PallaxSaveViewControllerTest, TheFilesNameIsThePresentWhileTheDisplaysClo
         made->savePressed();
         present.advance(5s);
     }
-    ASSERT_EQ(files.files.size(), 2U) << "none has replaced the other";
+    ASSERT_EQ(files.files.size(), 2U) << "neither has replaced the other";
     const std::string folder = "/var/mobile/Library/Logs/Faultbox/";
     for (const char* name :
          {"PallaxSnapshot-1800000000.pallax", "PallaxSnapshot-1800000005.pallax"}) {
@@ -305,7 +305,7 @@ TEST_F(PallaxSaveViewControllerTest, WhatXmlCannotHoldIsReplacedAndNamedInTheLog
 TEST_F(PallaxSaveViewControllerTest, TheScreenIsClosedOnTheQueueAfterTheSave) {
     const auto made = open(two);
     made->savePressed();
-    EXPECT_EQ(closes, 0) << "only once the action has returned";
+    EXPECT_EQ(closes, 0) << "closes only after the action has returned";
     queue.runReady();
     EXPECT_EQ(closes, 1);
 }

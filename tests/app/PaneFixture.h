@@ -13,7 +13,7 @@
 
 namespace pallax::doubles {
 
-/// An application object that says what its fields say.
+/// An application object whose answers are set by the test.
 class FakePaneApplication final : public PaneApplication {
 public:
     bool saveAllowed = false;
@@ -34,7 +34,7 @@ protected:
         return std::make_shared<PallaxPaneController>(toolkit, application, std::move(node),
                                                       std::move(path));
     }
-    /// The pane lies on a stack, as its root.
+    /// Puts the pane on a stack as its root.
     void putOnStack(PaneRef pane) {
         application.stack = std::make_unique<FakeNavigationStack>(toolkit.diary, std::move(pane));
     }

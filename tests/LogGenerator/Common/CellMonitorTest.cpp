@@ -174,14 +174,14 @@ TEST(CellMonitor, AnElementThatLacksEitherKeyIsNoCell) {
         EXPECT_TRUE(element.dictionary()->remove(key));
         EXPECT_FALSE(kServingCell.looksFor(element)) << key;
         element.dictionary()->setFixed(key, PropertyList::integer(1));
-        EXPECT_FALSE(kServingCell.looksFor(element)) << key << " with a value that is no text";
+        EXPECT_FALSE(kServingCell.looksFor(element)) << key << " with a value that is not a text";
     }
 }
 
-/// What the record of numbers shows and logs of one cell.
+/// The values and log lines of the numbers record for one cell.
 struct Shown {
     PropertyList section;
-    Lines lines; ///< but for its first
+    Lines lines; ///< without the first
 };
 
 Shown numbersOf(const Array& cells) {
@@ -207,7 +207,7 @@ TEST(CellMonitor, TheFirstOfSeveralCellsIsShown) {
 
 // Numbers
 
-/// What is shown of a value under "a", or "(none)" with its line.
+/// The shown value of "a" or, if there is none, "(none)" with its line.
 std::string numberOf(const PropertyList& value) {
     const auto [shown, lines] = numbersOf({servingCell({{"a", value}})});
     const bool isMissed =
@@ -268,7 +268,7 @@ TEST(CellNumber, WithoutASectionOnlyTheMissingOnesAreLogged) {
 
 // Levels
 
-/// The entry of a neighbour with a level under each of the two keys.
+/// The entry of a neighbour with a level under both keys.
 PropertyList levelsOf(std::int32_t number) {
     RecordFixture<Entries> fixture;
     fixture.feed(
@@ -293,7 +293,7 @@ TEST(CellLevel, IsTheLow16BitsSignedTimesItsFactor) {
 
 TEST(CellLevel, Is32767AsTheEmptyString) {
     expectLevels(32767, "", "");
-    expectLevels(0x17FFF, "", ""); // by its low 16 bits
+    expectLevels(0x17FFF, "", ""); // the low 16 bits count
 }
 
 // Entries

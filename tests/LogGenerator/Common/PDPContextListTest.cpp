@@ -91,7 +91,7 @@ TEST(PDPContextList, TheCodeIsNotChecked) {
 }
 
 TEST(PDPContextList, AnyBytesNeitherThrowNorLeaveAKey) {
-    anyBytesKeepWithin<PDPContextList>({}); // random bytes make no dictionary inside an array
+    anyBytesKeepWithin<PDPContextList>({}); // random bytes are never an array of dictionaries
 }
 
 TEST(PDPContextList, AnyArrayIsShownAsItIsAndAnythingElseChangesNothing) {

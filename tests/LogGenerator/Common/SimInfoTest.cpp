@@ -18,7 +18,7 @@ using UnknownDataException = LogCode_0xFF000020::UnknownDataException;
 
 constexpr LogCode kSimFiles = 0xFF0000;
 
-/// Every file, each with a text of its own, and in the order of the display.
+/// Every file with its own text, in the order of the display.
 const std::vector<std::pair<const char*, const char*>> kFilesToKeys = {
     {"kSimFile_ICCID", "EF-ICCID"},
     {"kSimFile_MSISDN", "EF-MSISDN"},
@@ -36,7 +36,7 @@ const std::vector<std::pair<const char*, const char*>> kFilesToKeys = {
     {"kSimFile_OPLMNAcT", "EF-OPLMNAcT"},
 };
 
-/// The files from the last to the first, so that their order is not that of the display.
+/// The files in reverse order, so not in the order of the display.
 Record allFiles() {
     Dictionary files;
     for (auto row = kFilesToKeys.rbegin(); row != kFilesToKeys.rend(); ++row) {

@@ -2,15 +2,15 @@
 
 #include "tests/doubles/RecordBuilder.h"
 
-/// The connected-mode measurement, of which three records read each its part.
+/// The connected-mode measurement; three records read a part of it.
 namespace pallax::doubles {
 
-/// The fixed part, claiming that many entries.
+/// The fixed part, which claims these numbers of entries.
 inline Record connectedModeHead(unsigned measured, unsigned detected) {
     return Record(0xB179).padTo(27).u8(measured).u8(detected);
 }
 
-/// Two measured neighbours, the second at the ends of the ranges, and one detected cell: 43 bytes.
+/// Two measured neighbours, the second with the greatest values, and one detected cell: 43 bytes.
 inline Record twoMeasuredOneDetected() {
     return connectedModeHead(2, 1)
         .u16(275)

@@ -15,7 +15,7 @@ using doubles::Record;
 using doubles::RecordingLog;
 using Lines = std::vector<RecordingLog::Line>;
 
-/// With the template that the application carries.
+/// With the application's template.
 struct LTEFixture : GeneratorFixture {
     LTEFixture() {
         resources.add("LTE", doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/LTE.plist"));

@@ -18,7 +18,7 @@ PropertyList serving(std::int64_t tac, std::int64_t cellId, std::int64_t pid, st
         {{"UARFCN", uarfcn}, {"BandInfo", band}, {"PID", pid}, {"CellId", cellId}, {"TAC", tac}});
 }
 
-/// The numbers of a cell: the key in the array, the key shown, what is logged without it.
+/// The numbers of a cell: key in the array, shown key, and the line logged without it.
 constexpr auto kNumbers = std::to_array<std::array<const char*, 3>>({
     {"kHXCellMonitorTAC", "Tracking Area Code", "Serving Cell Info: Failed to retrieve TAC\n"},
     {"kHXCellMonitorCellId", "Cell Identity", "Serving Cell Info: Failed to retrieve Cell ID\n"},
@@ -83,7 +83,7 @@ TEST(LTEServingCellInfoCellMonitor, WhatIsNo32BitNumberIsLoggedInTheOrderOfTheKe
         expected.push_back({3, number[2]});
     }
     EXPECT_EQ(fixture.lines, expected);
-    EXPECT_TRUE(fixture.keys().empty()) << "the second serving cell is not looked at";
+    EXPECT_TRUE(fixture.keys().empty()) << "the second serving cell is ignored";
 }
 
 TEST(LTEServingCellInfoCellMonitor, UARFCNIsRemovedBy0xB0C2) {
@@ -103,7 +103,7 @@ TEST(LTEServingCellInfoCellMonitor, UARFCNIsRemovedBy0xB0C2) {
 }
 
 TEST(LTEServingCellInfoCellMonitor, ABrokenPropertyListLogsTwoLinesAndChangesNothing) {
-    // The text form, of which no beginning is a property list of its own.
+    // A list in text form: none of its prefixes is a property list.
     constexpr std::string_view kCells = "( { kHXCellMonitorTAC = 1; } )";
     RecordFixture<LTEServingCellInfo> fixture;
     fixture.feed(cellsRecord({serving(1, 2, 3, 4, 5)}));

@@ -57,12 +57,12 @@ TEST(MeasuredNeighborCells, ACountOf0IsRefusedWithExpected0AndEmptiesTheList) {
 }
 
 TEST(MeasuredNeighborCells, TheLengthComparisonSeesOnlyTheLowBytes) {
-    // 50 entries of 6 bytes are 300, whose low byte is 44; the 129 bytes hold 16 of them.
+    // 50 entries of 6 bytes are 300 bytes (low byte 44); the 129 bytes contain 16 of them.
     RecordFixture<MeasuredNeighborCells> passed;
     passed.feed(connectedModeHead(50, 0).padTo(129));
     EXPECT_EQ(passed.lines, (Lines{{4, "Measured Neighbor Cells"}}));
     EXPECT_EQ(passed.list().size(), 16U) << "the list stops at the last whole entry";
-    // 40 entries are 240, and the record is long enough: 29 + 240, whose low byte is 13.
+    // 40 entries are 240 bytes; the record is long enough, but the low byte of 29 + 240 is 13.
     RecordFixture<MeasuredNeighborCells> refused;
     refused.list() = Array{"what was shown before"};
     refused.feed(connectedModeHead(40, 0).padTo(269));
@@ -72,10 +72,10 @@ TEST(MeasuredNeighborCells, TheLengthComparisonSeesOnlyTheLowBytes) {
 
 TEST(MeasuredNeighborCells, TheLengthComparisonPrintsUnsignedLowBytesAndWrapsBelow0) {
     RecordFixture<MeasuredNeighborCells> fixture;
-    // 42 entries are 252; 29 - 2 x 16 is -3, whose low byte is 253.
+    // 42 entries are 252 bytes; 29 - 2 x 16 is -3 (low byte 253).
     fixture.feed(connectedModeHead(42, 16));
     EXPECT_EQ(fixture.lines, (Lines{{4, "Measured Neighbor Cells"}})) << "252 fits into 253";
-    EXPECT_TRUE(fixture.list().empty()) << "not one entry is there";
+    EXPECT_TRUE(fixture.list().empty()) << "it contains no entry";
     // 29 - 2 x 17 is -5: 251.
     fixture.feed(connectedModeHead(42, 17));
     EXPECT_EQ(fixture.lines, (Lines{{4, "Measured Neighbor Cells"}, refusal(252, 251)}));

@@ -31,7 +31,7 @@ constexpr auto kPackedFields = std::to_array<PackedField>({
     {"Ant 1 Sample Offset", 13, 3, 19, plain},
 });
 
-/// A record that claims `count` cells (1 to 32) and holds nothing behind its fixed part.
+/// A record that claims `count` cells (1 to 32) and ends after its fixed part.
 Record head(unsigned count) {
     const unsigned word = (count - 1) << 6U;
     return Record(0xB180).padTo(19).u16(word);
@@ -99,9 +99,9 @@ TEST(NeighborCellsList, OneBitAtATimeChangesItsKeyAlone) {
 
 TEST(NeighborCellsList, Antenna1RepeatsAntenna0) {
     RecordFixture<NeighborCellsList> fixture;
-    // Frame offset 0x123; sample offset 0x54321, whose low bits stand from bit 3 of byte 13 on.
+    // Frame offset 0x123; sample offset 0x54321, which begins at bit 3 of byte 13.
     const unsigned packed = 0x123U | 0x54321U << 11U;
-    Record record = head(1).append(cellOf(0xFF)); // nothing else is read for them
+    Record record = head(1).append(cellOf(0xFF)); // no other byte is read for them
     for (unsigned byte = 0; byte < 4; ++byte) {
         record.at(kEntriesStart + 12 + byte, packed >> (8 * byte) & 0xFFU);
     }
@@ -153,7 +153,7 @@ TEST(NeighborCellsList, ACountFieldOf0GivesOneCellAnd31Gives32) {
     fixture.feed(record);
     EXPECT_EQ(fixture.list().size(), 32U);
     EXPECT_EQ(fixture.lines[1].text, "Number of neighboring cells being reported: 32\n");
-    fixture.feed(record.at(19, 0x3F).at(20, 0xF8)); // every other bit of the word
+    fixture.feed(record.at(19, 0x3F).at(20, 0xF8)); // all other bits of the word
     EXPECT_EQ(fixture.list().size(), 1U);
     EXPECT_EQ(fixture.lines[1].text, "Number of neighboring cells being reported: 1\n");
 }

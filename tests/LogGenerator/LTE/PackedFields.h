@@ -9,8 +9,8 @@
 #include <span>
 #include <string>
 
-/// What a bit-packed record must show, worked out without the reader: where each key's bits stand,
-/// and the text of a raw value as printf makes it.
+/// The expected content of a bit-packed record, computed without the reader: the position of each
+/// key's bits, and the text of a raw value as printf formats it.
 namespace pallax::doubles {
 
 struct PackedField {
@@ -21,7 +21,7 @@ struct PackedField {
     std::string (*shown)(std::uint32_t raw);
 };
 
-/// The text of raw x factor + offset with that many decimals and what follows the number.
+/// The text of raw x factor + offset with that many decimals, and the text after the number.
 inline std::string scaledText(std::uint32_t raw, double factor, double offset, int decimals,
                               const char* suffix) {
     std::array<char, 64> buffer{};
@@ -49,7 +49,7 @@ inline std::string less30Dbm(std::uint32_t raw) {
     return scaledText(raw, 1, -30, 0, " dBm");
 }
 
-/// The whole section when one bit alone is set: bit `bit` of byte `byte`.
+/// The whole section when only bit `bit` of byte `byte` is set.
 inline Dictionary withOneBit(std::span<const PackedField> fields, std::size_t byte, unsigned bit) {
     const std::size_t place = byte * 8 + bit;
     Dictionary expected;

@@ -18,7 +18,7 @@ Record candidatesHead(unsigned count) {
     return Record(0xB186).u8(1).u8(0).u16(1850).u16(274).u16(count);
 }
 
-/// One candidate of that technology over eight bytes that are all different.
+/// One candidate of that technology, followed by eight different bytes.
 Record oneCandidate(unsigned technology) {
     return candidatesHead(1)
         .u16(0x0102)
@@ -96,7 +96,7 @@ TEST(ReselectionCandidatesList, TheCellIDIsBits7To15OfItsWord) {
 }
 
 TEST(ReselectionCandidatesList, EntriesStand4BytesApartSoThatTheirTechnologyDataOverlaps) {
-    // Entry 0 (LTE) stands at 21, entry 1 (GERAN) at 25.
+    // Entry 0 (LTE) begins at 21, entry 1 (GERAN) at 25.
     const Record record = candidatesHead(2)
                               .u16(7)
                               .u16(0)
@@ -135,7 +135,7 @@ TEST(ReselectionCandidatesList, AnEntryIsWholeWhenTheBytesReadForItsTechnologyLi
 }
 
 TEST(ReselectionCandidatesList, TheListStopsAtTheFirstEntryThatIsNotWhole) {
-    // The third entry is whole, but the CDMA entry before it is not, and so neither is shown.
+    // The third entry is whole, but the CDMA entry before it is not, so neither is shown.
     RecordFixture<ReselectionCandidatesList> fixture;
     fixture.feed(candidatesHead(3).u16(1).u16(9).u16(2).u16(3).u16(4).u16(9));
     EXPECT_EQ(fixture.list(),
@@ -197,7 +197,7 @@ TEST(ReselectionCandidatesList, AnyBytesKeepItsEntriesWithinItsKeys) {
                                         "Channel",
                                         "Pilot"};
     anyBytesKeepWithin<ReselectionCandidatesList>(keys);
-    // Of any bytes, few are a technology: the same with technologies that are mostly known.
+    // Random bytes are rarely a known technology, so most of these entries have one.
     anyRecordsKeepWithin<ReselectionCandidatesList, NothingThrown>(
         keys, codesOf<ReselectionCandidatesList>(), [](LogCode) {
             Record record = candidatesHead(any::below(12));

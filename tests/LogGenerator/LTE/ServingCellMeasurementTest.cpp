@@ -48,7 +48,7 @@ constexpr auto kPackedServingCell = std::to_array<PackedField>({
     {"Measurement Rules", 32, 2, 4, plain},
 });
 
-/// The record with every payload byte set to one value.
+/// The record with this value in every payload byte.
 Record servingCellOf(unsigned byte) {
     Record record(0xB17F);
     for (std::size_t at = 13; at < kLength; ++at) {

@@ -17,8 +17,8 @@ constexpr std::size_t entriesStart(unsigned transportChannels) {
     return 289 + 34 * std::size_t{transportChannels};
 }
 
-/// A record of T transport and S composite channels that ends where those begin; every byte on
-/// the way there is set.
+/// A record of T transport and S composite channels that ends where the composite channels begin;
+/// all bytes before are set.
 Record channels(unsigned transport, unsigned composite) {
     Record record(0xD00C);
     record.u8(0xFF).u16(transport << 6U | composite << 12U | 0x3F);
@@ -80,7 +80,7 @@ TEST(CCTRCHSIRMeasurement, TheCountIsTheUpperFourBitsOfByte15) {
     fixture.feed(Record(0xD00C).padTo(entriesStart(0) + 15 * 8).at(15, 0x30));
     EXPECT_EQ(fixture.list().size(), 3U);
     fixture.feed(channels(63, 0).padTo(entriesStart(63) + 15 * 8));
-    EXPECT_TRUE(fixture.list().empty()) << "the transport channels' count";
+    EXPECT_TRUE(fixture.list().empty()) << "the number of transport channels";
 }
 
 TEST(CCTRCHSIRMeasurement, NoChannelsEmptyTheList) {
@@ -115,7 +115,7 @@ TEST(CCTRCHSIRMeasurement, TheListStopsAtTheFirstChannelThatIsNotWhole) {
 TEST(CCTRCHSIRMeasurement, AnyBytesKeepItsEntriesWithinItsKeys) {
     const std::set<std::string> keys = {"CCTRCH ID", "TSNUM", "SIR"};
     anyBytesKeepWithin<CCTRCHSIRMeasurement>(keys);
-    // Behind the fixed distance to the first entry.
+    // With bytes after the fixed distance to the first entry.
     anyRecordsKeepWithin<CCTRCHSIRMeasurement, NothingThrown>(
         keys, codesOf<CCTRCHSIRMeasurement>(), [](LogCode) {
             const auto transport = any::below(64);

@@ -79,7 +79,7 @@ TEST(RRC_State, AShortPacketIsLoggedAndReadAllTheSameWithItsMissingBytesZero) {
               (Lines{{4, "RRC Info"},
                      {4, "LogCode_0xD0E0 is length is 14 expected size 15"},
                      {4, "Display Dict = { State = Disconnected; }, rrc mode = 0 Disconnected"}}));
-    fixture.feed(Record(0xD0E0)); // version 0 is a foreign one
+    fixture.feed(Record(0xD0E0)); // version 0 is not understood
     EXPECT_EQ(fixture.lines, (Lines{{4, "RRC Info"},
                                     {4, "LogCode_0xD0E0 is length is 13 expected size 15"},
                                     {4, "Display Dict = { State = Unknown RRC Mode; }, "

@@ -47,13 +47,13 @@ TEST(TRCHBLERMeasurement, TheCountIsBits6To11OfTheWordAtByte14) {
         fixture.feed(counts(byte14, byte15).padTo(17 + 2 * 63));
         return fixture.list().size();
     };
-    EXPECT_EQ(shown(0x3F, 0xF0), 0U) << "the bits on both sides";
+    EXPECT_EQ(shown(0x3F, 0xF0), 0U) << "the neighbouring bits";
     EXPECT_EQ(shown(0x40, 0x00), 1U);
     EXPECT_EQ(shown(0x80, 0x00), 2U);
     EXPECT_EQ(shown(0x00, 0x01), 4U);
     EXPECT_EQ(shown(0x00, 0x08), 32U);
     EXPECT_EQ(shown(0xC0, 0x0F), 63U);
-    EXPECT_EQ(shown(0x00, 0x30), 0U) << "the composite channels' count";
+    EXPECT_EQ(shown(0x00, 0x30), 0U) << "the number of composite channels";
 }
 
 TEST(TRCHBLERMeasurement, NoChannelsEmptyTheList) {

@@ -15,7 +15,7 @@ using doubles::Record;
 using doubles::RecordingLog;
 using Lines = std::vector<RecordingLog::Line>;
 
-/// The path of every resource is what the test says.
+/// Resources with these paths.
 class ResourcesAt final : public Resources {
 public:
     explicit ResourcesAt(std::vector<std::string> paths) : _paths(std::move(paths)) {}
@@ -31,7 +31,7 @@ private:
     std::vector<std::string> _paths;
 };
 
-/// The names under which a generator asks for its template.
+/// The template names that a generator requests.
 std::vector<std::string> askedFor(std::vector<std::string> paths) {
     GeneratorFixture fixture;
     const ResourcesAt resources(std::move(paths));

@@ -21,7 +21,7 @@ constexpr std::uint32_t packed(unsigned uarfcn, unsigned cellId, unsigned rscp, 
     return uarfcn | cellId << 14U | rscp << 21U | status << 29U | detected << 31U;
 }
 
-/// Every byte that is not read is set.
+/// All bytes that are not read are set.
 Record utranNeighbours(const std::vector<std::uint32_t>& cells) {
     Record record(0xD00A);
     while (record.bytes().size() < kEntries) {
@@ -111,7 +111,7 @@ TEST(UTRANNeighbhorMeasurements, TheStatusIsAbsentFor3) {
     EXPECT_EQ(shown(packed(1, 1, 1, 1, 0), "Status"), "MSET");
     EXPECT_EQ(shown(packed(1, 1, 1, 2, 0), "Status"), "DSET");
     EXPECT_EQ(shown(packed(1, 1, 1, 3, 0), "Status"), "(absent)");
-    EXPECT_EQ(shown(packed(1, 1, 1, 3, 0), "inJDCS"), "FALSE") << "the key behind it is set";
+    EXPECT_EQ(shown(packed(1, 1, 1, 3, 0), "inJDCS"), "FALSE") << "the next key is set";
 }
 
 TEST(UTRANNeighbhorMeasurements, ACountOf0EmptiesTheListAndAPacketOf21BytesIsEnough) {
@@ -146,7 +146,7 @@ TEST(UTRANNeighbhorMeasurements, TheListStopsAtTheFirstCellWhoseFourBytesAreNotW
 TEST(UTRANNeighbhorMeasurements, AnyBytesKeepItsEntriesWithinItsKeys) {
     const std::set<std::string> keys = {"UARFCN", "Cell ID", "Filter RSCP", "Status", "inJDCS"};
     anyBytesKeepWithin<UTRANNeighbhorMeasurements>(keys);
-    // Behind the fixed distance to the first entry.
+    // With bytes after the fixed distance to the first entry.
     anyRecordsKeepWithin<UTRANNeighbhorMeasurements, NothingThrown>(
         keys, codesOf<UTRANNeighbhorMeasurements>(), [](LogCode code) {
             return Record(code)

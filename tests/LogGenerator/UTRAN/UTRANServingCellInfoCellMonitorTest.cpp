@@ -43,7 +43,8 @@ TEST(UTRANServingCellInfoCellMonitor, TheScanDoesNotStopAtTheFirstMatchSoTheLast
     fixture.feed(cellsRecord({serving(100), serving(200), half}));
     EXPECT_EQ(fixture.text("Local Area Code"), "7");
     EXPECT_EQ(fixture.text("Cell Scrambling Code"), "8");
-    EXPECT_EQ(fixture.text("Cell ID"), "201") << "what the last cell lacks stays of the one before";
+    EXPECT_EQ(fixture.text("Cell ID"), "201")
+        << "a value missing in the last cell is kept from the one before";
     EXPECT_EQ(fixture.text("Downlink UARFCN"), "204");
 }
 
@@ -128,7 +129,7 @@ TEST(UTRANServingCellInfoCellMonitor, ANumberThatIsNoSigned32BitIntegerCountsAsM
 }
 
 TEST(UTRANServingCellInfoCellMonitor, ABrokenPropertyListLogsOneLineAndChangesNothing) {
-    // The text form, of which no beginning is a property list of its own.
+    // A list in text form: none of its prefixes is a property list.
     const ByteBuffer whole = textRecord(0xFF0001, "( { kHXCellMonitorLAC = 1; } )").bytes();
     CellMonitorFixture fixture;
     fixture.feed(cellsRecord({serving(100)}));

@@ -11,7 +11,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-/// The bytes and bits that are not read are set.
+/// All bytes and bits that are not read are set.
 Record servingCell() {
     return Record(0xD0E2)
         .u8(0xA5)

@@ -17,7 +17,7 @@ using doubles::RecordingLog;
 using doubles::sameInOrder;
 using Lines = std::vector<RecordingLog::Line>;
 
-/// A generator that found no template, with a log that begins behind its making.
+/// A generator without a template; the log begins after its creation.
 class UTRANWithoutTemplate : public testing::Test {
 protected:
     UTRANLogGenerator& generator() { return dynamic_cast<UTRANLogGenerator&>(*_generator); }
@@ -77,7 +77,7 @@ TEST_F(UTRANWithoutTemplate, ItsEndIsThatOfItsBase) {
     EXPECT_TRUE(_fixture.standardOutput.lines.empty()) << "there was no index";
 }
 
-/// The model among fakes, with the real technologies and no resource.
+/// The model with fakes, the real technologies and no resources.
 class UTRANModelWithoutTemplate : public ModelFixture {
 protected:
     void SetUp() override {
@@ -97,7 +97,7 @@ protected:
 TEST_F(UTRANModelWithoutTemplate, ItsStartCommandIsNoPropertyListSoTheStartFailsAndIsRetried) {
     start();
     EXPECT_EQ(errors().back(), " Could not generate PLIST");
-    ASSERT_EQ(ports.requests.size(), 1U) << "the query, but no start command";
+    ASSERT_EQ(ports.requests.size(), 1U) << "the query, and no start command";
     EXPECT_TRUE(retriesAfter5Seconds());
     EXPECT_EQ(errors().back(), " Could not generate PLIST");
     EXPECT_EQ(ports.requests.size(), 2U);
@@ -106,7 +106,7 @@ TEST_F(UTRANModelWithoutTemplate, ItsStartCommandIsNoPropertyListSoTheStartFails
 TEST_F(UTRANModelWithoutTemplate, TheModelHasNothingToShowAndNothingToSave) {
     start();
     EXPECT_TRUE(model->getSaveContents().isNull());
-    (void)model->topLevelNodes(); // of no display
+    (void)model->topLevelNodes(); // null without a display
     EXPECT_EQ(model->nodeAtPath("RRC Info"), nullptr);
 }
 

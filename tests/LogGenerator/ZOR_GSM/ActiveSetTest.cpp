@@ -11,7 +11,7 @@ constexpr std::uint32_t kMinus5dB = 200000;
 constexpr std::uint32_t kMinus1dB = 500000;
 constexpr std::uint32_t kMinus31dB = 706;
 
-/// The value under `key` of the only cell of a set after a packet.
+/// The value of `key` in the only cell of a set after a packet.
 std::string shown(const Record& record, std::string_view key) {
     RecordFixture<ActiveSet> fixture;
     fixture.feed(record);
@@ -85,7 +85,7 @@ TEST(ActiveSet, TheEnergyIsTheFirstOfTheThreeWordsThatIsNotZero) {
     EXPECT_EQ(energyPerChip({kMinus5dB, kMinus1dB, kMinus31dB}), "-5 dB");
     EXPECT_EQ(energyPerChip({0, kMinus1dB, kMinus31dB}), "-1 dB");
     EXPECT_EQ(energyPerChip({0, 0, kMinus31dB}), "-31 dB");
-    EXPECT_EQ(energyPerChip({0, 0, 0}), "0 dB") << "the third, also when it is zero";
+    EXPECT_EQ(energyPerChip({0, 0, 0}), "0 dB") << "all are 0";
     EXPECT_EQ(energyPerChip({0xFFFFFFFF, kMinus1dB, 0}), "0 dB") << "unsigned";
     EXPECT_EQ(energyPerChip({1, kMinus1dB, 0}), "0 dB") << "too small to measure, but not zero";
 }

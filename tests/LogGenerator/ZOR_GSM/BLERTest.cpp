@@ -12,7 +12,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-/// The second channel holds the ends of the ranges.
+/// The second channel has the greatest values.
 Record twoChannels() {
     return Record(0x4116)
         .u8(2)      // channels
@@ -72,7 +72,7 @@ TEST(BLER, TheArrayIsReplacedByANewOne) {
     const ArrayRef earlier = fixture.keys().find("Transport Channels")->array();
     fixture.feed(twoChannels().at(13, 1));
     EXPECT_EQ(channelCount(fixture), 1U);
-    EXPECT_EQ(*earlier, twoChannelsShown()) << "who held the one before keeps it as it was";
+    EXPECT_EQ(*earlier, twoChannelsShown()) << "the earlier list is unchanged";
 }
 
 TEST(BLER, TheListStopsAtTheFirstChannelThatIsNotWhole) {

@@ -11,7 +11,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-/// Two entries, of which the second starts three bytes behind the first.
+/// Two entries; the second begins three bytes after the first.
 Record twoNetworks() {
     return Record(0x7150).padTo(16).u8(2).append({3, 0, 1, 1, 0, 0, 2, 6, 0});
 }

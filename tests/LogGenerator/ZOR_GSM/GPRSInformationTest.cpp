@@ -16,14 +16,14 @@ Record control(unsigned pfc, unsigned threshold, unsigned order) {
     return Record(0x51F5).u8(pfc).u8(threshold).u8(order).padTo(18);
 }
 
-/// The text under `key` after a record whose byte `offset` is `value`.
+/// The text of `key` after a record with `value` in byte `offset`.
 std::string shown(Record record, std::size_t offset, unsigned value, std::string_view key) {
     RecordFixture<GPRSInformation> fixture;
     fixture.feed(record.at(offset, value));
     return fixture.text(key);
 }
 
-/// Every byte value shows its label: 255 the first, 0 the second, and so on; "Unknown" beyond.
+/// Each byte value shows its label: 255 the first, 0 the second, and so on, else "Unknown".
 void expectLabelsByBytePlusOne(const Record& record, std::size_t offset, std::string_view key,
                                const std::vector<std::string>& labels) {
     for (unsigned value = 0; value < 256; ++value) {

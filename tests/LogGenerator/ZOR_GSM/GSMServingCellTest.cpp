@@ -65,7 +65,7 @@ TEST(GSMServingCell, LogsItsLineOnEveryAcceptedPacket) {
     EXPECT_EQ(fixture.keys().size(), 7U) << "all three were accepted";
 }
 
-/// C1 and C2 in one record are the quality words of the other.
+/// GSMRRInfo shows the same words as quality.
 TEST(GSMServingCell, C1AndC2AreTheRxQualityOfGSMRRInfoReadWithAnotherWidthAndSign) {
     RecordFixture<GSMServingCell> cell;
     RecordFixture<GSMRRInfo> state;

@@ -11,7 +11,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-/// Two entries at the ends of their ranges.
+/// Two entries with the least and greatest values.
 Record twoGsmCells() {
     return Record(0x4005)
         .u8(0) // UMTS entries

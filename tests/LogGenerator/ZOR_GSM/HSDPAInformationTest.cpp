@@ -23,11 +23,11 @@ Record header(unsigned primary, unsigned secondary) {
         .u8(secondary);
 }
 
-/// One process of each kind, the secondary one at 18 + 162 = 180.
+/// One process of each kind; the secondary one is at 18 + 162 = 180.
 Record oneOfEach() {
     Record record = header(1, 1);
     record.u8(4).u32(4000000000).u16(65535).u16(17); // primary, at 18
-    record.u8(99).padTo(180);                        // at 27 stands nothing that is read
+    record.u8(99).padTo(180);                        // the bytes from 27 are not read
     return record.u8(5).u32(1).u16(2).u16(3);
 }
 
@@ -113,7 +113,7 @@ TEST(HSDPAInformation, WithoutPrimaryProcessesTheirKeyIsLeftAsItWas) {
     EXPECT_EQ(*fixture.keys().find(kPrimary),
               PropertyList(Array{process("4", "4000000000", "65535", "17")}));
     EXPECT_EQ(*fixture.keys().find(kSecondary), PropertyList(Array{process("6", "60", "61", "62")}))
-        << "without primary processes the secondary ones start at 18";
+        << "without primary processes the secondary ones begin at 18";
 }
 
 TEST(HSDPAInformation, WithoutSecondaryProcessesTheirKeyIsLeftAsItWas) {
@@ -131,7 +131,7 @@ TEST(HSDPAInformation, TheArraysAreReplacedByNewOnes) {
     const ArrayRef secondary = fixture.keys().find(kSecondary)->array();
     fixture.feed(header(1, 1).padTo(189));
     EXPECT_EQ(*primary, Array{process("4", "4000000000", "65535", "17")})
-        << "who held the one before keeps it as it was";
+        << "the earlier list is unchanged";
     EXPECT_EQ(*secondary, Array{process("5", "1", "2", "3")});
     EXPECT_EQ(*fixture.keys().find(kPrimary), PropertyList(Array{process("0", "0", "0", "0")}));
 }

@@ -21,7 +21,7 @@ struct Neighbour {
 Record measured(const std::vector<Neighbour>& neighbours) {
     Record record = Record(0x5137).padTo(28).u8(static_cast<unsigned>(neighbours.size()));
     for (const auto& [arfcn, rssi, c1] : neighbours) {
-        record.u16(arfcn).u8(rssi).s32(c1).append({1, 2, 3, 4, 5, 6, 7}); // 7 bytes not read
+        record.u16(arfcn).u8(rssi).s32(c1).append({1, 2, 3, 4, 5, 6, 7}); // 7 bytes are not read
     }
     return record;
 }
@@ -34,7 +34,7 @@ Record bsics(const std::vector<std::pair<unsigned, unsigned>>& list) {
     return record;
 }
 
-/// The text under `key` of an entry of the list; "(absent)" without it.
+/// The text of `key` in an entry of the list; "(absent)" if there is none.
 std::string entryText(RecordFixture<NeighboringCells>& fixture, std::size_t index,
                       std::string_view key) {
     const PropertyList* value = fixture.list().at(index).dictionary()->find(key);
@@ -182,7 +182,7 @@ TEST(NeighboringCells, ALevelOf32767IsTheEmptyStringAndMinus40IsMinus80dBm) {
                               cell("GSM", "Neighbor", {{"ARFCN", 4}, {"RSSI", -32768}})}));
     EXPECT_EQ(entryText(fixture, 0, "RSSI"), "");
     EXPECT_EQ(entryText(fixture, 1, "RSSI"), "-80 dBm");
-    EXPECT_EQ(entryText(fixture, 2, "RSSI"), "-80 dBm") << "by its low 16 bits";
+    EXPECT_EQ(entryText(fixture, 2, "RSSI"), "-80 dBm") << "the low 16 bits count";
     EXPECT_EQ(entryText(fixture, 3, "RSSI"), "-65536 dBm");
     EXPECT_EQ(fixture.list()[1].dictionary()->find("RSSI")->displayNumber()->integer(), -80);
 }

@@ -9,7 +9,7 @@
 #include <string>
 #include <vector>
 
-/// The searcher's cell list (0x417A) as its four sets are fed with it.
+/// The searcher's cell list (0x417A) for the tests of its four sets.
 namespace pallax::doubles {
 
 struct SearcherCell {
@@ -18,7 +18,7 @@ struct SearcherCell {
     std::array<std::uint32_t, 3> energies = {0, 0, 0};
 };
 
-/// The bytes that no set reads are not zero.
+/// Bytes that no set reads are not zero.
 inline Record searcherRecord(int receiveAgc, const std::vector<SearcherCell>& cells) {
     constexpr unsigned kUnread = 0xA5;
     const auto unread = [](Record& record, int count) {
@@ -42,7 +42,7 @@ inline Record searcherRecord(int receiveAgc, const std::vector<SearcherCell>& ce
     return record;
 }
 
-/// What the searcher sets have in common: code, log lines, short packets, the emptying by N = 0.
+/// The tests that all searcher sets share: code, log lines, short packets, emptying by N = 0.
 template <class SetClass>
 void expectSearcherSet(std::string_view section, const std::string& logLine) {
     using Lines = std::vector<RecordingLog::Line>;
@@ -54,7 +54,7 @@ void expectSearcherSet(std::string_view section, const std::string& logLine) {
 
     const Array earlier = {"what was shown before"};
     fixture.list() = earlier;
-    fixture.feed(Record(0x417A).s16(0)); // 15 bytes: one less than the minimum
+    fixture.feed(Record(0x417A).s16(0)); // 15 bytes, one below the minimum
     EXPECT_EQ(fixture.lines, (Lines{{4, logLine}}));
     EXPECT_EQ(fixture.list(), earlier) << "a short packet is dropped silently";
 
@@ -67,7 +67,7 @@ void expectSearcherSet(std::string_view section, const std::string& logLine) {
     EXPECT_TRUE(fixture.list().empty());
 }
 
-/// A set that every packet empties, whatever set types its cells have.
+/// A set that every packet empties, for all set types of cells.
 template <class SetClass>
 void expectAlwaysEmptied() {
     RecordFixture<SetClass> fixture;

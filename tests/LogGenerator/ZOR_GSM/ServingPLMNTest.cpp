@@ -75,7 +75,7 @@ TEST(ServingPLMN, TheLocationAreaCodeIsBigEndianUnsignedAndKeepsItsNumber) {
     ASSERT_NE(fixture.keys().find("Location Area Code")->displayNumber(), nullptr);
     EXPECT_EQ(fixture.keys().find("Location Area Code")->displayNumber()->integer(), 65534);
     EXPECT_EQ(fixture.keys().find("Mobile Country Code")->displayNumber(), nullptr)
-        << "digits are a text";
+        << "digits are shown as a text";
 }
 
 TEST(ServingPLMN, EveryServiceTypeHasItsLabel) {

@@ -14,7 +14,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-/// Subscribes to nothing; if it is called all the same, logs its line and changes nothing.
+/// Subscribes to no code. If called anyway, it logs its line and changes nothing.
 template <class RecordClass>
 void expectSilent(std::string_view section, const std::string& line) {
     RecordFixture<RecordClass> fixture;

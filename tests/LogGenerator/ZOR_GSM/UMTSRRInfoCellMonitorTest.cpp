@@ -67,11 +67,11 @@ TEST(UMTSRRInfoCellMonitor, ANumberThatIsNo32BitIntegerCountsAsMissing) {
                                     {3, "UMTSRRInfo: Failed to retrieve Cell ID\n"},
                                     {3, "UMTSRRInfo: Failed to retrieve UARFCN\n"},
                                     {3, "UMTSRRInfo: Failed to retrieve Scrambling Code\n"}}));
-    EXPECT_TRUE(fixture.keys().empty()) << "the second serving cell is not looked at";
+    EXPECT_TRUE(fixture.keys().empty()) << "the second serving cell is ignored";
 }
 
 TEST(UMTSRRInfoCellMonitor, ABrokenPropertyListLogsTwoLinesAndChangesNothing) {
-    // The text form, of which no beginning is a property list of its own.
+    // A list in text form: none of its prefixes is a property list.
     constexpr std::string_view kCells = "( { kHXCellMonitorCellId = 1; } )";
     const ByteBuffer whole = textRecord(kCellMonitorLogCode, kCells).bytes();
     RecordFixture<UMTSRRInfo> fixture;

@@ -35,7 +35,7 @@ Record transmitPower(const std::vector<int>& rawPowers) {
     return record;
 }
 
-/// What "Transmit Power" shows after a record.
+/// The shown "Transmit Power" after a record.
 std::string powerAfter(const ByteBuffer& bytes) {
     RecordFixture<UMTSRRInfo> fixture;
     fixture.feed(bytes);
@@ -124,10 +124,10 @@ TEST(UMTSRRInfo, TheMeanOfTheTransmitPowersIsNotCutToWholeNumbers) {
     EXPECT_EQ(powerAfter(transmitPower(std::vector<int>(255, 32767)).bytes()), "3257.00 dBm");
 }
 
-// "%4.2lf dBm" of an empty mean: the not-a-number is 3 characters in a width of 4.
+// "%4.2lf dBm" of an empty mean: "nan" has 3 characters in a width of 4.
 TEST(UMTSRRInfo, Percent4Point2lf_dBm_OfAnEmptyMeanIsABlankAndNan) {
     EXPECT_EQ(powerAfter(transmitPower({}).bytes()), " nan dBm") << "no entries";
-    EXPECT_EQ(powerAfter(transmitPower({0, 0}).bytes()), " nan dBm") << "none that counts";
+    EXPECT_EQ(powerAfter(transmitPower({0, 0}).bytes()), " nan dBm") << "no power counts";
     EXPECT_EQ(powerAfter(Record(0x4031).u8(0).u8(255).u8(0).bytes()), " nan dBm") << "none whole";
     RecordFixture<UMTSRRInfo> fixture;
     fixture.feed(transmitPower({}));

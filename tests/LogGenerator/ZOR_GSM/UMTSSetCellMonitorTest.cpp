@@ -52,7 +52,7 @@ TEST(UMTSSetCellMonitor, RSCPNumber32767ShowsTheEmptyStringAndSoDoesTheEnergy) {
                                                 {"Energy Per Chip", ""}},
                                      Dictionary{{"UARFCN", "32767"},
                                                 {"Scrambling Code", "32767"},
-                                                {"RSCP", ""}, // its low 16 bits are 32767
+                                                {"RSCP", ""}, // the low 16 bits are 32767
                                                 {"Energy Per Chip", ""}}}));
 }
 
@@ -117,7 +117,7 @@ TEST(UMTSSetCellMonitor, ANumberThatIsNo32BitIntegerCountsAsMissing) {
 }
 
 TEST(UMTSSetCellMonitor, ABrokenPropertyListEmptiesTheListAndLogsTwoLines) {
-    // The text form, of which no beginning is a property list of its own.
+    // A list in text form: none of its prefixes is a property list.
     constexpr std::string_view kCells = "( { kHXCellMonitorUARFCN = 1; } )";
     const ByteBuffer whole = textRecord(kCellMonitorLogCode, kCells).bytes();
     for (std::size_t length = 0; length < whole.size(); ++length) {

@@ -12,7 +12,7 @@ namespace {
 using namespace doubles; // NOLINT: the vocabulary of these tests
 using Lines = std::vector<RecordingLog::Line>;
 
-/// The second entry holds the ends of the ranges.
+/// The second entry has the greatest values.
 Record twoUmtsCells() {
     return Record(0x4005)
         .u8(2) // UMTS entries

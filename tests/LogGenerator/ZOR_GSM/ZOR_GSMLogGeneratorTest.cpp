@@ -71,7 +71,8 @@ TEST(ZOR_GSMLogGenerator, SectionsWithoutACodeExistFromTheStartAndNeverChange) {
                           doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/ZOR_GSM.plist"));
     const auto generator = ZOR_GSMLogGenerator::generator(fixture.environment());
     Dictionary state;
-    generator->updateState(state, Record(0x1234).bytes()); // builds the display, reaches nobody
+    generator->updateState(
+        state, Record(0x1234).bytes()); // builds the display; the code has no subscribers
     expectSilentSectionsEmpty(state);
     doubles::FakeStandardOutput output;
     for (const std::string& logCode : ZOR_GSMClassIndex(output).getAllLogCodes()) {
@@ -86,7 +87,7 @@ TEST(ZOR_GSMLogGenerator, SectionsWithoutACodeExistFromTheStartAndNeverChange) {
     expectSilentSectionsEmpty(state);
 }
 
-/// What the records log of a packet to a generator whose display stands.
+/// The lines that records log for a packet when the display exists.
 Lines recordLinesOf(const Record& record) {
     GeneratorFixture fixture;
     fixture.resources.add("ZOR_GSM",

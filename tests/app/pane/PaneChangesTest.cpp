@@ -13,14 +13,14 @@ namespace {
 
 using namespace doubles; // NOLINT: the vocabulary of these tests
 
-/// A pane that has shown `before` and then `now`.
+/// A pane that has shown `before`, then `now`.
 PaneModel reloaded(std::vector<NodeRef> before, std::vector<NodeRef> now) {
     PaneModel pane(treeNode("Section", std::move(before)), "/Section");
     pane.show(treeNode("Section", std::move(now)));
     return pane;
 }
 
-/// Which rows have changed, as "-" and "*".
+/// The changed rows as "*", the others as "-".
 std::string changes(const PaneModel& pane) {
     std::string marks;
     for (std::size_t row = 0; row < pane.totalRows(); ++row) {
@@ -93,7 +93,7 @@ TEST(PaneChangesTest, RowsThatMoveAtEachReloadAreComparedWithTheLastOneOnly) {
     EXPECT_EQ(changes(pane), "-*");
 }
 
-/// A few leaves, each name once, in any order.
+/// A few leaves with different names in any order.
 std::vector<std::pair<std::string, std::string>> anyLeaves() {
     constexpr int kNames = 5;
     std::vector<std::pair<std::string, std::string>> unique;
@@ -158,7 +158,7 @@ TEST(PaneChangesTest, ALeafShownBeforeAsANodeWithoutChildrenLeavesAllRowsNew) {
     EXPECT_EQ(changes(pane), "*");
 }
 
-/// A leaf that counts how often a value is looked at.
+/// A leaf that counts how often its value is read.
 class CountingLeaf final : public PallaxModelNode {
 public:
     CountingLeaf(std::string name, PropertyList value, int& looks)
@@ -189,7 +189,7 @@ TEST(PaneChangesTest, NothingIsDoneForRowsThatAreNotAskedFor) {
     pane.show(section("2"));
     EXPECT_EQ(looks, 0);
     EXPECT_TRUE(pane.row(kRows - 1).hasChanged);
-    EXPECT_EQ(looks, 4) << "its text and number, then one look at either value";
+    EXPECT_EQ(looks, 4) << "its text, its number, and both values of the comparison";
 }
 
 /// The time of a tick.
@@ -197,7 +197,7 @@ Time at(int seconds) {
     return Time{std::chrono::seconds(1'700'000'000 + seconds)};
 }
 
-/// A pane of the leaves A and B, at each tick with other values.
+/// A pane of the leaves A and B, whose values are set at each tick.
 class PaneAgesTest : public testing::Test {
 protected:
     void tick(int seconds, const char* a, const char* b) {
@@ -245,7 +245,7 @@ TEST_F(PaneAgesTest, ARowThatWasNotAskedForInBetweenHasNoAge) {
     tick(0, "1", "2");
     tick(2, "1", "3");
     EXPECT_EQ(changedAt(1), at(2));
-    tick(4, "1", "9"); // not asked for
+    tick(4, "1", "9"); // the row is not requested
     tick(6, "1", "9");
     EXPECT_EQ(changedAt(1), std::nullopt);
 }

@@ -16,7 +16,7 @@ class PaneModelTest : public testing::Test {
 protected:
     void show(std::initializer_list<const char*> names) { pane.show(sectionOf(names)); }
 
-    /// The names of the shown rows, that of the cursor between brackets.
+    /// The names of the shown rows, with the cursor's in brackets.
     std::string shown() const {
         std::string text;
         for (std::size_t at = 0; at < pane.shownRows(); ++at) {

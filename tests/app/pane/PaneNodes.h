@@ -17,7 +17,7 @@ inline NodeRef treeNode(std::string name, std::vector<NodeRef> children) {
     return std::make_shared<PallaxModelTreeNode>(std::move(name), std::move(children));
 }
 
-/// A section of leaves of these names, each with the value "-".
+/// A section of leaves with these names and the value "-".
 inline NodeRef sectionOf(std::initializer_list<const char*> names) {
     std::vector<NodeRef> leaves;
     for (const char* name : names) {

@@ -91,7 +91,7 @@ TEST(PaneRowTest, ADictionaryWhoseKeysAreNumberedInOrderCountsAsAList) {
     EXPECT_EQ(elementsIn(Dictionary{{"0", "a"}, {"1", "b"}}), 2U);
 }
 
-/// A leaf of a display that keeps when its values were read.
+/// A leaf that knows when its value was read.
 class ReadLeaf final : public PallaxModelNode {
 public:
     explicit ReadLeaf(Time time) : PallaxModelNode("Leaf"), _time(time) {}

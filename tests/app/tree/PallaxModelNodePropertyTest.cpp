@@ -13,8 +13,8 @@ namespace any = doubles::any;
 constexpr int kDeepest = 4;
 constexpr int kWidest = 6;
 
-/// A display object of strings, dictionaries and arrays; every dictionary is sorted or not, and
-/// names hold separators, slashes and repetitions.
+/// A display object of strings, dictionaries and arrays. Some dictionaries are sorted, and names
+/// contain separators, slashes and repetitions.
 PropertyList randomObject(int depth) {
     const int kind = any::between(0, depth > 0 ? 3 : 1);
     if (kind == 0) {
@@ -45,7 +45,7 @@ struct Count {
     friend bool operator==(const Count&, const Count&) = default;
 };
 
-/// What the object holds, its reserved keys left out.
+/// Counts the object's content without the reserved keys.
 void count(const PropertyList& object, Count& total) {
     if (const auto dictionary = object.dictionary()) {
         ++total.branches;
@@ -64,7 +64,7 @@ void count(const PropertyList& object, Count& total) {
     }
 }
 
-/// Walks a tree with the path of every node, children before their parent, as it was built.
+/// Visits every node with its path, parents before children.
 template <class Visit>
 void walk(const NodeRef& node, const std::string& path, const Visit& visit) {
     if (const auto* children = node->childNodes()) {
@@ -112,7 +112,7 @@ TEST(PallaxModelNodeProperty, SortedRowsAreInAscendingOrderOfTheirKeys) {
         const std::vector<std::string> keys = any::texts();
         Dictionary object{{"_sorted", "1"}};
         for (const std::string& key : keys) {
-            object.set(key, key); // the value remembers the key
+            object.set(key, key); // the value names its key
         }
         object.set("_sorted", "1");
         PathDictionary paths;

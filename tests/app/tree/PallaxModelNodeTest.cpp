@@ -249,8 +249,9 @@ TEST(PallaxModelNode, ThePlainNodeHasNeitherChildrenNorValue) {
     EXPECT_EQ(node.value(), nullptr);
 }
 
-/// Ends the process with 0 when the tree of an array waits for the array lock, the tree of
-/// dictionaries does not, and the lock is free afterwards; else with the number of what failed.
+/// Exits with 0 if making the tree of an array waits for the array lock, making the tree of
+/// dictionaries does not, and the lock is free afterwards; otherwise with the number of the failed
+/// check.
 [[noreturn]] void buildWhileTheLockIsHeld() {
     const auto build = [](const PropertyList& object) {
         return std::async(std::launch::async, [object] {
