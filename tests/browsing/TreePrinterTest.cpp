@@ -9,7 +9,7 @@ namespace {
 
 class TreePrinterTest : public testing::Test {
 protected:
-    /// What a tick prints whose display is `object`.
+    /// The output of a tick with the display `object`.
     std::string tick(const PropertyList& object) {
         PathDictionary paths;
         root = PallaxModelNode::makeTreeFromObject(object, paths);

@@ -39,7 +39,7 @@ TEST(Output, AFullDiskIsNamed) {
     } catch (const OutputFailure& failure) {
         EXPECT_STREQ(failure.what(), "Standard output cannot be written: No space left on device.");
     }
-    output.flush(); // what could not be written is not tried again
+    output.flush(); // does not retry the text that was not written
     ::close(full);
 }
 
@@ -66,15 +66,15 @@ TEST(Output, WhatNobodyTakesIsGivenUpOnceASignalAsksForTheEnd) {
     int pipe[2] = {};
     ASSERT_EQ(::pipe(pipe), 0);
     Output output(writeToDescriptor(pipe[1], "Standard output"));
-    output.text() = std::string(1U << 20U, 'x'); // more than the pipe holds
+    output.text() = std::string(1U << 20U, 'x'); // more than fits into the pipe
     (void)std::raise(SIGTERM);
     EXPECT_THROW(output.flush(), OutputClosed);
-    queue.run(); // it has heard of the signal
+    queue.run(); // the queue has handled the signal
     ::close(pipe[0]);
     ::close(pipe[1]);
 }
 
-/// What comes out of a pseudo-terminal into which the blocks are written.
+/// The output of a pseudo-terminal into which the blocks are written.
 std::string onTerminal(const std::vector<std::string>& blocks) {
     int terminal = -1;
     int program = -1;

@@ -12,7 +12,7 @@ using doubles::ManualClock;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-/// A manual clock that counts how often it is looked at.
+/// A manual clock that counts its calls.
 class CountedClock final : public Clock {
 public:
     Time now() const override {
@@ -82,7 +82,7 @@ TEST(ProgressBar, ItIsAsLongAsTheShare) {
     EXPECT_EQ(progressBar(0.337), "[##########                    ]  33 %");
     EXPECT_EQ(progressBar(0.999), "[############################# ]  99 %");
     EXPECT_EQ(progressBar(1), "[##############################] 100 %");
-    EXPECT_EQ(progressBar(1.5), progressBar(1)) << "a file that grows";
+    EXPECT_EQ(progressBar(1.5), progressBar(1)) << "the file has grown";
     EXPECT_EQ(progressBar(-1), progressBar(0));
 }
 
@@ -111,7 +111,7 @@ TEST_F(TerminalLineTest, ATextTakesThePlaceOfTheOneBefore) {
 TEST_F(TerminalLineTest, WipedNothingStays) {
     TerminalLine shown = line(80);
     shown.wipe();
-    EXPECT_EQ(written, "") << "nothing was there";
+    EXPECT_EQ(written, "") << "nothing was shown before";
     shown.show("abc");
     shown.wipe();
     EXPECT_EQ(written, "\rabc\r   \r");

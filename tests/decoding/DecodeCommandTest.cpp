@@ -54,7 +54,7 @@ protected:
     DecodeOptions options;
     std::map<std::string, std::unique_ptr<Recording>> recordings;
     std::string written;
-    std::vector<std::string> blocks; // the same, as it was handed on
+    std::vector<std::string> blocks; // the same in the original blocks
     std::vector<std::string> reports;
     doubles::FakeResources resources;
     doubles::FakeBundle bundle;
@@ -256,7 +256,7 @@ TEST_F(DecodeCommandTest, ATechnologyWithoutAGeneratorIsNamed) {
                            "other.pcap: there is no log generator for the technology Another."});
 }
 
-/// A recording whose bytes can be counted, as those of a file.
+/// A recording that knows its size, like a file.
 class ScriptedFile final : public Recording {
 public:
     explicit ScriptedFile(ScriptedRecording recording) : _recording(std::move(recording)) {}
@@ -294,11 +294,11 @@ TEST_F(DecodeCommandTest, ATemplateThatCannotBeLoadedIsNoFaultOfItsPacket) {
     add("b.pcap", {{milliseconds(0), "?the template is gone"}});
     try {
         (void)run();
-        ADD_FAILURE() << "it does not leave";
+        ADD_FAILURE() << "nothing was thrown";
     } catch (const TemplateFailure& failure) {
         EXPECT_STREQ(failure.what(), "the template is gone");
     }
-    EXPECT_EQ(written, "{\"Cell\":{\"A\":\"1\"}}\n") << "what came before is written";
+    EXPECT_EQ(written, "{\"Cell\":{\"A\":\"1\"}}\n") << "earlier displays are written";
     EXPECT_EQ(reports, std::vector<std::string>{});
 }
 

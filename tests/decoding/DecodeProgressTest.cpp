@@ -22,7 +22,7 @@ protected:
         return {columns, [this](std::string_view bytes) { written += bytes; }};
     }
 
-    /// Reads a recording to its end, a packet each second.
+    /// Reads a recording to its end, one packet each second.
     void readThrough(DecodeProgress& progress, std::size_t place, const std::string& path) {
         const auto recording = Recording::open(path);
         ASSERT_TRUE(recording);
@@ -56,7 +56,7 @@ TEST_F(DecodeProgressTest, TheShareIsThatOfAllBytes) {
         readThrough(progress, 1, kSecond);
         EXPECT_TRUE(written.ends_with("100 %")) << written;
     }
-    EXPECT_TRUE(written.ends_with("100 %\r" + std::string(38, ' ') + "\r")) << "wiped at the end";
+    EXPECT_TRUE(written.ends_with("100 %\r" + std::string(38, ' ') + "\r")) << "cleared at the end";
 }
 
 TEST_F(DecodeProgressTest, ARecordingThatCannotBeReadCountsAsDone) {
@@ -75,7 +75,7 @@ TEST_F(DecodeProgressTest, WhereOneHasNoSizePacketsAreCounted) {
     ASSERT_TRUE(recording);
     DecodeProgress progress({kFirst, "-"}, line(), clock);
     for (std::uint64_t count = 1; count <= 7; ++count) {
-        progress.packetDone(0, **recording, count); // in no time
+        progress.packetDone(0, **recording, count); // without any time passing
     }
     progress.recordingDone(0);
     EXPECT_EQ(written, "");
@@ -83,7 +83,7 @@ TEST_F(DecodeProgressTest, WhereOneHasNoSizePacketsAreCounted) {
     for (std::uint64_t count = 1; written.empty() && count <= 64; ++count) {
         progress.packetDone(1, **recording, count);
     }
-    EXPECT_EQ(written, "\r15 packets") << "7 of the first, 8 until the clock is looked at";
+    EXPECT_EQ(written, "\r15 packets") << "7 of the first, then 8 until the clock is read";
 }
 
 TEST_F(DecodeProgressTest, AMissingRecordingHasNoBytes) {

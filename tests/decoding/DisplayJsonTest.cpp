@@ -72,11 +72,11 @@ TEST(DisplayJson, KeepsUtf8AndReplacesEachInvalidByte) {
     EXPECT_EQ(json("Zürich \u20AC \U0001F4F1"), "\"Zürich \u20AC \U0001F4F1\"");
     const std::string replaced = "\xEF\xBF\xBD";
     EXPECT_EQ(json("a\xFFz"), "\"a" + replaced + "z\"");
-    EXPECT_EQ(json("\xC3"), "\"" + replaced + "\"") << "cut in the middle";
+    EXPECT_EQ(json("\xC3"), "\"" + replaced + "\"") << "an incomplete character";
     EXPECT_EQ(json("\xC0\x80"), "\"" + replaced + replaced + "\"") << "overlong";
     EXPECT_EQ(json("\xED\xA0\x80"), "\"" + replaced + replaced + replaced + "\"") << "surrogate";
     EXPECT_EQ(json("\xF4\x90\x80\x80"), "\"" + replaced + replaced + replaced + replaced + "\"")
-        << "beyond U+10FFFF";
+        << "above U+10FFFF";
 }
 
 TEST(DisplayJson, AnEntryWhoseKeyIsNoStringIsLeftOut) {

@@ -56,7 +56,7 @@ protected:
         ADD_FAILURE() << name << " is not listed";
         return {};
     }
-    /// The line of that field, with one blank where there are several.
+    /// The line of that field, with runs of blanks as one blank.
     std::string lineOf(const std::string& name) {
         for (const std::string& line : textOf(name.substr(0, name.find('.')))) {
             if (line.starts_with(name + " ")) {

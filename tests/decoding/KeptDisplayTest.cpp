@@ -16,7 +16,7 @@
 namespace pallax {
 namespace {
 
-/// Generators of all technologies on one state, as after restarts of the link.
+/// Generators of several technologies with one state, as after restarts of the link.
 class KeptDisplay : public testing::Test {
 protected:
     using Packets = std::vector<ByteBuffer>;
@@ -25,7 +25,7 @@ protected:
         return LogGenerator::generatorFromTechnology(Text(technology), technologies(),
                                                      {clock, resources, bundle, notices});
     }
-    /// The packets of a sample, or those of its second half.
+    /// The packets of a sample, or of its second half.
     static Packets packetsOf(const std::string& sample, bool isSecondHalf) {
         const auto recording =
             Recording::open(std::string(PALLAX_SOURCE_DIR) + "/samples/" + sample + ".pcap");
@@ -65,7 +65,7 @@ TEST_F(KeptDisplay, AGeneratorTellsForEachPairOfTechnologiesWhetherTheDisplayWil
         for (const auto& [second, secondSample] : samples) {
             Dictionary state;
             const auto before = generatorOf(first);
-            EXPECT_FALSE(before->keepsDisplay(state)) << first << ", the first one";
+            EXPECT_FALSE(before->keepsDisplay(state)) << first << ", as the first generator";
             feed(*before, state, packetsOf(firstSample, false));
             const std::string shown = shownBy(*before, state);
             ASSERT_GT(shown.size(), 100U) << first;

@@ -11,7 +11,7 @@ namespace {
 
 class RequiredTemplatesTest : public testing::Test {
 protected:
-    /// What is thrown when `ask` is called with the templates; empty when nothing is.
+    /// The error thrown when `ask` is called with the templates; empty if there is none.
     template <class Ask>
     std::string sentenceOf(const Ask& ask) const {
         try {

@@ -13,14 +13,14 @@
 #include <utility>
 #include <vector>
 
-/// A recording written in a test, and a generator for its packets.
+/// A recording defined by a test, and a generator for its packets.
 namespace pallax::doubles {
 
 inline constexpr Time kFirstPacket{std::chrono::seconds{1700000000}}; // 2023-11-14T22:13:20Z
 inline constexpr NumberFormat kScriptedDbm{"%.2f dBm"};
 
-/// Packets are texts: "KEY=VALUE" stores a value in the display's section "Cell" ("KEY=-94.75dBm"
-/// as a display number), "KEY" alone removes one, "!REASON" throws, "?SENTENCE" misses its
+/// Packets are texts: "KEY=VALUE" stores a value in the display's section "Cell" ("KEY=-94.75dBm" a
+/// display number), "KEY" alone removes it, "!REASON" throws, "?SENTENCE" reports a missing
 /// template.
 class ScriptedGenerator final : public LogGenerator {
 public:
@@ -35,7 +35,7 @@ public:
         std::size_t captured;
         friend bool operator==(const Generated&, const Generated&) = default;
     };
-    /// Every display generation of all instances, until a test clears it.
+    /// The display generations of all instances, until a test clears them.
     inline static std::vector<Generated> generations;
 
     void updateState(Dictionary& state, Bytes data) override {
@@ -120,7 +120,7 @@ private:
     const RecordedTechnology* _technology;
     std::optional<RecordingError> _atEnd;
     std::size_t _next = 0;
-    ByteBuffer _bytes; // one buffer for all, as a real recording has
+    ByteBuffer _bytes; // one buffer for all packets, as in a real recording
     std::optional<RecordingError> _error;
 };
 

@@ -68,13 +68,13 @@ TEST(TickGrid, AStepBackGivesTheLastTickAndTheNextLieOnAGridFromThere) {
 TEST(TickGrid, AfterOneStampThatIsAheadTheTicksGoOn) {
     TickGrid grid;
     std::uint64_t ticks = 0;
-    for (int packet = 0; packet < 240; ++packet) { // of two minutes
+    for (int packet = 0; packet < 240; ++packet) { // two minutes of packets
         const Time ahead =
             kFirstStamp + milliseconds(500) * packet + seconds(packet == 8 ? 3600 : 0);
         const auto tick = grid.passedBefore(ahead);
         ticks += tick ? 1 : 0;
     }
-    EXPECT_EQ(ticks, 60U); // without that stamp there are 59
+    EXPECT_EQ(ticks, 60U); // 59 without that stamp
 }
 
 TEST(TickGrid, AGapIsToldAndLeavesTheGridAsItIs) {

@@ -12,13 +12,13 @@ constexpr std::string_view kPrompt = "$ ";
 constexpr std::string_view kCutLines = "...";
 constexpr std::string_view kCutText = "…";
 
-/// The line from its first visible character on: blocks of a list are indented.
+/// The line without indentation, which blocks in lists have.
 std::string_view unindented(std::string_view line) {
     const std::size_t begin = line.find_first_not_of(' ');
     return begin == std::string_view::npos ? std::string_view() : line.substr(begin);
 }
 
-/// Whether the text begins with the pieces' first, ends with their last and holds the others.
+/// Whether the text starts with the first piece, ends with the last and contains the others.
 bool isLineShown(std::string_view shown, std::string_view text) {
     const std::size_t cut = shown.find(kCutText);
     if (cut == std::string_view::npos) {
@@ -103,7 +103,7 @@ private:
     }
 
     int _line = 0;
-    std::optional<std::string> _kind; // of the block that is open
+    std::optional<std::string> _kind; // of the open block
     std::size_t _indentation = 0;
     bool _continues = false;
 };

@@ -7,23 +7,23 @@
 
 namespace pallax::doubles {
 
-/// A command of a document, and what the document says that it prints.
+/// A command in a document, and the output that the document shows.
 struct ShownCommand {
     std::string command;
-    std::vector<std::string> output; ///< lines; none where the document does not show any
-    int line = 0;                    ///< of the document, from 1 on
-    std::size_t block = 0;           ///< number of its block, from 1 on
+    std::vector<std::string> output; ///< lines; empty if the document shows none
+    int line = 0;                    ///< line in the document, from 1
+    std::size_t block = 0;           ///< number of its block, from 1
 };
 
-/// The commands of a document's fenced `console` blocks: lines that begin with "$ ", and after one
-/// that ends with a backslash the next. Lines that follow are what the command prints.
+/// The commands in a document's fenced `console` blocks: lines that begin with "$ ", and the next
+/// line after each that ends with a backslash. The lines that follow are the command's output.
 std::vector<ShownCommand> shownCommands(std::string_view document);
 
-/// The kinds of all fenced blocks ("console"), in their order; empty texts for those without.
+/// The kinds of all fenced blocks ("console"), in order; an empty text for a block without a kind.
 std::vector<std::string> blockKinds(std::string_view document);
 
-/// Whether the text is what the lines show: a line "..." stands for any number of lines, "…" for
-/// any text within a line.
+/// Whether the lines match the text: a line "..." matches any number of lines, "…" any text in a
+/// line.
 bool isShown(const std::vector<std::string>& lines, const std::string& text);
 
 } // namespace pallax::doubles

@@ -12,8 +12,8 @@
 #include <sstream>
 #include <string_view>
 
-// Every command that a document shows is run as its reader would run it, in a folder that holds
-// what commands use of a clone, and what it prints is held against what the document shows.
+// Runs every command that a document shows, in a folder with the parts of a clone that commands
+// use, and compares its output with the output shown.
 
 namespace pallax {
 namespace {
@@ -26,7 +26,7 @@ using doubles::runCommand;
 using doubles::ShownCommand;
 using doubles::shownCommands;
 
-/// How commands begin that are not run here: they build, install or need what a test has not.
+/// Beginnings of commands that are not run: they build, install, or need more than a test has.
 constexpr auto kNotRun = std::to_array<std::string_view>({
     "./run",
     "./test",
@@ -37,7 +37,7 @@ constexpr auto kNotRun = std::to_array<std::string_view>({
     "build/dev/tests/",
 });
 
-/// Commands that go on until they are left: they get Ctrl-C after two seconds, and end well.
+/// Commands that run until the user quits: they get Ctrl-C after two seconds and must succeed.
 constexpr auto kUntilLeft = std::to_array<std::string_view>({
     "pallax",
     "pallax demo lte --seed 7",
@@ -51,8 +51,7 @@ constexpr auto kUntilLeft = std::to_array<std::string_view>({
     "pallax record --rotate-seconds 3600 hours.pcapng",
 });
 
-/// What the documents take for granted beside a clone: recordings of the reader's own, and
-/// programs that are none of ours.
+/// Recordings and programs of the reader that the documents presume.
 constexpr const char* kSurroundings = R"sh(
 cp samples/lte-drive.pcap drive.pcap
 cp samples/gsm-attach.pcap other.pcap
@@ -71,7 +70,7 @@ END
 chmod +x "$BIN/modem-dump" "$BIN/ssh"
 )sh";
 
-/// Begins the script: a shell in which one command after the other is run.
+/// Begins the script: one shell runs all commands in order.
 constexpr const char* kBegin = R"sh(
 untilServed() {
     for ((look = 0; look < 200; ++look)); do
@@ -121,7 +120,7 @@ bool isInBackground(const ShownCommand& command) {
     return withoutComment(command.command).ends_with('&');
 }
 
-/// Viewers and recorders of the live modem wait where none is served.
+/// Removes the notice of viewers and recorders that wait for a live modem.
 std::string withoutWaiting(std::string printed) {
     constexpr std::string_view kWaiting = "pallax: No telephony service is running; waiting.\n";
     if (const auto at = printed.find(kWaiting); at != std::string::npos) {
@@ -130,7 +129,7 @@ std::string withoutWaiting(std::string printed) {
     return printed;
 }
 
-/// A clone and a home, and the scripts that run in them.
+/// A clone, a home folder, and the scripts that run in them.
 class DocumentedWorld : public testing::Test {
 protected:
     DocumentedWorld() {
@@ -165,7 +164,7 @@ protected:
         return script.str();
     }
 
-    /// Runs those that are to be run, in one shell, each with a file for what it prints.
+    /// Runs the commands in one shell and writes the output of each to its own file.
     void run(const std::vector<ShownCommand>& commands) const {
         std::ostringstream script;
         script << scriptsBegin();
@@ -192,7 +191,7 @@ protected:
     doubles::TemporaryFolder folder;
 };
 
-/// The same for one document.
+/// The world of one document.
 class Documents : public DocumentedWorld, public testing::WithParamInterface<std::string> {};
 
 TEST_P(Documents, EveryCommandDoesWhatIsShown) {

@@ -10,8 +10,8 @@
 #include <string_view>
 #include <vector>
 
-// Which folder may include from which. A header without a source would pass every linker, so the
-// arrows of docs/architecture.md are held here.
+// Which folder may include from which. The linker cannot check headers without a source, so this
+// test checks the arrows of docs/architecture.md.
 
 namespace pallax {
 namespace {
@@ -24,7 +24,7 @@ struct Layer {
     std::vector<std::string> mayInclude; ///< beside itself
 };
 
-/// From the bottom up: a folder may include from earlier ones only.
+/// From the bottom up: a folder may include only from earlier ones.
 const std::vector<Layer>& layers() {
     static const std::string records = "LogGenerator/Records";
     static const std::string generators = "LogGenerator";
@@ -85,11 +85,11 @@ const std::vector<Layer>& layers() {
     return all;
 }
 
-/// Those above everything, which include what they look at, and of the tests what is shared.
+/// The folders above all others, which may include from any folder, and from tests what is shared.
 const std::set<std::string> kAbove{"bench", "fuzz"};
 const std::string kStage = "tests/ui/terminal/StageScript.h"; ///< shared with a fuzz target
 
-/// The row that a file belongs to: that of the longest folder; else the first folder of its path.
+/// The row of a file: the one with the longest matching folder, or the first folder of its path.
 std::string layerOf(const std::string& path) {
     std::string found;
     for (const Layer& layer : layers()) {
@@ -100,7 +100,7 @@ std::string layerOf(const std::string& path) {
     return found.empty() ? path.substr(0, path.find('/')) : found;
 }
 
-/// What the file includes of this source tree.
+/// The files of this source tree that the file includes.
 std::vector<std::string> includesOf(const std::string& path) {
     constexpr std::string_view kDirective = "#include \"";
     std::istringstream text(sourceText(path));

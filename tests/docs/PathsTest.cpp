@@ -8,7 +8,7 @@
 #include <string>
 #include <vector>
 
-// The files and folders that documents name, and those that they lead to, exist.
+// Checks that the files and folders that documents name or link to exist.
 
 namespace pallax {
 namespace {
@@ -20,12 +20,12 @@ using doubles::replaced;
 using doubles::sourceFiles;
 using doubles::sourceText;
 
-/// What stands for something else in a path: what a reader adds, or any name.
+/// Whether a path is a placeholder: an example that the reader adds, or any name.
 bool isInvented(const std::string& path) {
     return path.find("Example") != std::string::npos || path.find("NAME") != std::string::npos;
 }
 
-/// Everything that the pattern's group finds outside of fenced blocks.
+/// All texts that the pattern's group matches outside fenced blocks.
 std::set<std::string> found(const std::string& document, const std::string& pattern) {
     std::set<std::string> texts;
     for (const auto& match : matchesIn(replaced(document, "```[^`]*```", ""), pattern)) {
@@ -36,10 +36,11 @@ std::set<std::string> found(const std::string& document, const std::string& patt
 
 bool exists(const std::string& folder, const std::string& path) {
     const fs::path whole = fs::path(PALLAX_SOURCE_DIR) / folder / path;
-    return fs::exists(whole) || fs::exists(whole.string() + ".h"); // a class is named without
+    return fs::exists(whole) ||
+           fs::exists(whole.string() + ".h"); // documents may name a class without ".h"
 }
 
-/// Gives `look` each document with its folder and its text.
+/// Calls `look` with the folder and text of each document.
 template <class Look>
 void forEachDocument(const Look& look) {
     const std::vector<std::string> documents = sourceFiles({".md"});

@@ -13,7 +13,7 @@ namespace {
 namespace fs = std::filesystem;
 using doubles::contentOf;
 
-/// Everything that `pattern` (with `parts` groups, joined by dots) finds in a text.
+/// All matches of `pattern` in a text, with its `parts` groups joined by dots.
 std::set<std::string> found(const std::string& text, const std::string& pattern,
                             std::size_t parts) {
     std::set<std::string> names;
@@ -27,7 +27,7 @@ std::set<std::string> found(const std::string& text, const std::string& pattern,
     return names;
 }
 
-/// "Suite.Name" of every test in the source tree.
+/// "Suite.Name" of all tests in the source tree.
 std::set<std::string> allTests() {
     const std::string test = R"(TEST(?:_F|_P)?\(\s*(\w+),\s*(\w+)\s*\))";
     std::set<std::string> names;

@@ -5,7 +5,7 @@
 
 namespace pallax::doubles {
 
-/// A subpacket of any bytes; to be called inside a property.
+/// A subpacket of random bytes. Call it in a property only.
 inline Subpacket anySubpacket(unsigned id) {
     constexpr int kMaximumBytes = 60;
     Subpacket subpacket(id);

@@ -5,7 +5,7 @@
 
 namespace pallax::doubles {
 
-/// Every name that some layout of CDMA fills.
+/// All names that CDMA layouts fill.
 inline const std::vector<std::string> kLookupNames = {
     "kChannel",
     "kBandClass",

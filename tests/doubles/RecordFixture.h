@@ -69,9 +69,9 @@ PropertyList sectionAfter(const Record& record) {
     return fixture.section();
 }
 
-/// Feeds a log record cut at every length below `minimum` to a fixture and asserts that its section
-/// does not change, then cut at every further length, which must neither throw nor read outside
-/// (each cut is a separate buffer, so that a sanitizer detects that).
+/// Feeds a log record cut at every length to a fixture. Below `minimum` the section must not
+/// change; from there on, reading must neither throw nor read outside the record (each cut is a
+/// separate buffer, so that a sanitizer detects this).
 void cutAtEveryLength(SectionFixture& fixture, const Record& record, std::size_t minimum);
 
 template <class RecordClass>

@@ -20,9 +20,8 @@ bool keepsWithin(const PropertyList& section, const std::set<std::string>& keys)
 
 namespace any {
 
-/// Any bytes up to a length that holds every field and a good number of list entries. In half of
-/// the cases they are small numbers, so that the length can hold the count of entries and the
-/// entries are of a kind that is shown.
+/// Random bytes, up to a length that contains all fields and several list entries. In half of the
+/// cases they are small numbers, which are more often valid counts and kinds of entries.
 ByteBuffer recordBytes();
 
 /// A property list of any type, nested at most `depth` deep, with dictionary keys from `keys`.

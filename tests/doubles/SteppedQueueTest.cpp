@@ -67,7 +67,7 @@ TEST_F(SteppedQueueTest, ATimerRepeatsUntilItIsInvalidatedOrDestroyed) {
 
 TEST_F(SteppedQueueTest, ATimerMayBeDestroyedInsideItsOwnAction) {
     std::unique_ptr<RepeatingTimer> timer;
-    const std::string text(100, 'x'); // the action's own text, read after the timer's end
+    const std::string text(100, 'x'); // owned by the action, read after the timer's end
     timer = queue.scheduleRepeating(1s, [&timer, this, text] {
         timer.reset();
         seen.push_back(text);

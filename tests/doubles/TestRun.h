@@ -2,8 +2,8 @@
 
 namespace pallax::doubles {
 
-/// What the main of a test executable returns: 0 when every test passed, 1 when one failed,
-/// and kTestsSkipped when none failed but some were skipped, so that ctest can tell.
+/// The exit status of a test executable: 0 if all tests passed, 1 if one failed, and kTestsSkipped
+/// if none failed but some were skipped, so that ctest can tell.
 int runTests(int argc, char** argv);
 
 constexpr int kTestsSkipped = 77;

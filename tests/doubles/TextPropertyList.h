@@ -19,8 +19,8 @@ inline std::string quotedText(std::string_view text) {
     return out + '"';
 }
 
-/// The old text form of strings, arrays and dictionaries, which the program itself only reads.
-/// Throws std::invalid_argument for another type.
+/// The old text form of strings, arrays and dictionaries, which the program reads but never writes.
+/// Throws std::invalid_argument for other types.
 inline std::string textForm(const PropertyList& object) {
     if (const auto text = object.string()) {
         return quotedText(*text);

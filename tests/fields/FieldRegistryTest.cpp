@@ -26,7 +26,7 @@ FieldRegistry registryOf(std::string_view commandName) {
     throw std::invalid_argument("no such technology");
 }
 
-/// The last words of the names in each list's identity, by the path of its entries.
+/// The last words of the field names in each list's identity, by the path of its entries.
 using Identities = std::map<std::string, std::vector<std::string>>;
 
 Identities identitiesIn(std::string_view commandName) {

@@ -53,7 +53,7 @@ TEST(AsioMainQueue, AStopBeforeRunMakesItReturnAtOnceAndOnlyOnce) {
 TEST(AsioMainQueue, ALoopThatIsNotItsOwnRunsWhatIsReadyUntilItIsStopped) {
     AsioMainQueue queue;
     RunLoop& loop = queue;
-    EXPECT_TRUE(loop.runReady()) << "nothing is ready, which is no end";
+    EXPECT_TRUE(loop.runReady()) << "an empty queue has not ended";
     int blocks = 0;
     queue.async([&] {
         ++blocks;
@@ -62,7 +62,7 @@ TEST(AsioMainQueue, ALoopThatIsNotItsOwnRunsWhatIsReadyUntilItIsStopped) {
     });
     EXPECT_FALSE(loop.runReady());
     EXPECT_EQ(blocks, 1);
-    EXPECT_TRUE(loop.runReady()) << "a stop holds once";
+    EXPECT_TRUE(loop.runReady()) << "a stop counts once";
     EXPECT_EQ(blocks, 2);
     loop.stop();
     EXPECT_FALSE(loop.runReady());
@@ -139,7 +139,7 @@ TEST(AsioMainQueue, FiringsThatABusyQueueMissedAreLeftOut) {
     AsioMainQueue queue;
     int firings = 0;
     const auto timer = queue.scheduleRepeating(2ms, [&] { ++firings; });
-    std::this_thread::sleep_for(30ms); // the queue is busy elsewhere
+    std::this_thread::sleep_for(30ms); // the queue is busy
     queue.runReady();
     EXPECT_EQ(firings, 1);
 }

@@ -96,7 +96,7 @@ TEST_F(HostFilesTest, ALinkAPipeAndADeviceAreNotWrittenTo) {
 
     const std::string pipe = _folder.file("pipe");
     ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
-    EXPECT_FALSE(files.writePropertyList(pipe, "snapshot")) << "without waiting for a reader";
+    EXPECT_FALSE(files.writePropertyList(pipe, "snapshot")) << "does not wait for a reader";
     const Descriptor reader(::open(pipe.c_str(), O_RDWR | O_NONBLOCK | O_CLOEXEC));
     EXPECT_FALSE(files.writePropertyList(pipe, "snapshot"));
     std::array<char, 1> nothing{};
@@ -114,7 +114,7 @@ TEST_F(HostFilesTest, APropertyListIsWrittenInPlace) {
     ASSERT_TRUE(files.writePropertyList(path, PropertyList("tunnel")));
     struct stat after {};
     ASSERT_EQ(::stat(path.c_str(), &after), 0);
-    EXPECT_EQ(after.st_ino, before.st_ino) << "no other file takes its place";
+    EXPECT_EQ(after.st_ino, before.st_ino) << "the file is not replaced";
     EXPECT_TRUE(doubles::contentOf(path).starts_with("<?xml version=\"1.0\" encoding=\"UTF-8\"?>"))
         << doubles::contentOf(path);
     EXPECT_EQ(parsed("a.pallax"), PropertyList("tunnel"));
@@ -136,7 +136,7 @@ TEST_F(HostFilesTest, ExistsSeesFilesAndFolders) {
 TEST_F(HostFilesTest, PreferencesAreKeptPerDomainInOneFileEach) {
     FilePreferences preferences(_folder.file("p"));
     preferences.setValue("PLShowGSMRSSI", PropertyList::boolean(false), "com.norvane.screen");
-    EXPECT_FALSE(std::filesystem::exists(_folder.file("p"))); // not before synchronize
+    EXPECT_FALSE(std::filesystem::exists(_folder.file("p"))); // only synchronize writes it
     EXPECT_TRUE(preferences.synchronize("com.norvane.screen"));
     EXPECT_TRUE(preferences.synchronize("nothing was set here"));
     EXPECT_EQ(parsed("p/com.norvane.screen.plist"),

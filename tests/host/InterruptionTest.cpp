@@ -35,7 +35,7 @@ void restore() {
     (void)!::write(restorationReport, "restored", 8);
 }
 
-/// A pipe, the program under test at its full end.
+/// A full pipe, and its write end for the program under test.
 class InterruptionTest : public testing::Test {
 protected:
     InterruptionTest() {
@@ -52,7 +52,7 @@ protected:
         (void)::fcntl(writer.number(), F_SETFL, 0);
     }
 
-    /// Writes as the program's writers do; true when that was given up.
+    /// Writes like the program's writers; true when the write was given up.
     bool writeIsGivenUp() const {
         while (::write(writer.number(), "x", 1) < 0 && errno == EINTR) {
             if (Interruption::isDue()) {
@@ -62,7 +62,7 @@ protected:
         return false;
     }
 
-    /// The signal that a process dies of in which `action` runs; 0 if of none.
+    /// The signal that kills a process running `action`; 0 if none does.
     static int signalAfter(const std::function<void()>& action) {
         const pid_t child = ::fork();
         if (child == 0) {
@@ -112,7 +112,7 @@ TEST_F(InterruptionTest, BeforeItIsDueNothingIsInterrupted) {
     EXPECT_FALSE(Interruption::isDue());
     std::array<char, 4096> block{};
     ASSERT_EQ(::read(reader.number(), block.data(), block.size()), 4096);
-    EXPECT_FALSE(writeIsGivenUp()) << "somebody has made room";
+    EXPECT_FALSE(writeIsGivenUp()) << "the pipe has room again";
     queue.run();
 }
 

@@ -42,7 +42,7 @@ protected:
     static std::optional<HostError> begin(PcapNgWriter& writer) {
         return writer.begin(kZorellLte, "Zorell_LTE");
     }
-    /// How many packets the file has, as its reader finds; -1 when it is damaged.
+    /// The number of packets that a reader finds in the file; -1 if it is damaged.
     int packetsIn() const {
         const auto recording = Recording::open(path);
         if (!recording) {
@@ -80,7 +80,7 @@ TEST_F(PcapNgWriterTest, WritesASectionAnInterfaceWithItsNameAndPackets) {
 
 TEST_F(PcapNgWriterTest, IsReadBackToTheNanosecondWhileItIsBeingWritten) {
     const auto writer = create();
-    EXPECT_EQ(packetsIn(), -1) << "no interface, no link type";
+    EXPECT_EQ(packetsIn(), -1) << "without an interface there is no link type";
     for (int count = 1; count <= 3; ++count) {
         ASSERT_EQ(write(*writer, ByteBuffer(static_cast<std::size_t>(count - 1), 7)), std::nullopt);
         EXPECT_EQ(packetsIn(), count);
@@ -144,7 +144,7 @@ TEST_F(PcapNgWriterTest, AnEarlierFileIsReplacedByTheFirstPacketAndNotBefore) {
         const auto writer = create(Existing::Overwrite);
         EXPECT_EQ(doubles::contentOf(path), earlier);
     }
-    EXPECT_EQ(doubles::contentOf(path), earlier) << "no packet came";
+    EXPECT_EQ(doubles::contentOf(path), earlier) << "no packet has come";
     const auto writer = create(Existing::Overwrite);
     ASSERT_EQ(write(*writer, {1}), std::nullopt);
     EXPECT_EQ(packetsIn(), 1);
@@ -154,7 +154,7 @@ TEST_F(PcapNgWriterTest, AnEarlierFileIsReplacedByTheFirstPacketAndNotBefore) {
 TEST_F(PcapNgWriterTest, AFileThatGetsNoPacketIsRemoved) {
     {
         const auto writer = create();
-        EXPECT_TRUE(std::filesystem::exists(path)) << "the name is taken from the start";
+        EXPECT_TRUE(std::filesystem::exists(path)) << "the name is taken at the start";
         ASSERT_EQ(begin(*writer), std::nullopt);
     }
     EXPECT_FALSE(std::filesystem::exists(path));
@@ -252,7 +252,7 @@ TEST_F(PcapNgWriterTest, WhereAPacketDoesNotFitTheFileEndsWithTheOneBefore) {
     EXPECT_EQ(packetsIn(), 1);
 }
 
-/// Standard output is a pipe that nobody reads, and SIGTERM has come.
+/// Standard output is a pipe without a reader, and SIGTERM has come.
 class PcapNgWriterToAStalledPipe : public testing::Test {
 protected:
     PcapNgWriterToAStalledPipe() {
@@ -271,7 +271,7 @@ protected:
     }
     ~PcapNgWriterToAStalledPipe() override { (void)::dup2(output.number(), STDOUT_FILENO); }
 
-    /// Writes packets of that size until one is not taken.
+    /// Writes packets of that size until a write fails.
     HostError errorOfPackets(std::size_t size) const {
         if (auto error = writer->begin(kZorellLte, "Zorell_LTE")) {
             return std::move(*error);

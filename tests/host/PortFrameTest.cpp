@@ -32,7 +32,7 @@ std::vector<PortFrame> framesOf(PortFrameParser& parser, Bytes bytes, std::size_
     return frames;
 }
 
-/// The fault that a header gives whose byte at `offset` is `value`.
+/// The error for a header with `value` in the byte at `offset`.
 std::string faultWith(std::size_t offset, std::uint8_t value) {
     auto bytes = encodeHeader(headerOf(FrameKind::Message), 0);
     bytes.at(offset) = value;
@@ -138,7 +138,7 @@ TEST(PortFrame, OtherDataAreNoRemark) {
     data[0] = 4;
     EXPECT_EQ(decodeRemark(data), std::nullopt);
     data[0] = 1;
-    data.back() = 0x80; // a size below zero
+    data.back() = 0x80; // a negative size
     EXPECT_EQ(decodeRemark(data), std::nullopt);
     data.pop_back();
     EXPECT_EQ(decodeRemark(data), std::nullopt);

@@ -46,7 +46,7 @@ TEST_F(RecordingFileTest, AStreamThatNobodyWritesToIsToldAndWaitedFor) {
     EXPECT_EQ(told, (std::vector<std::string>{"Nothing has been written to " + pipe +
                                               " yet; waiting for it."}));
     EXPECT_EQ(::fcntl(opened->descriptor.number(), F_GETFL) & O_NONBLOCK, 0)
-        << "its reader waits for what comes";
+        << "the reader waits for more data";
 }
 
 TEST_F(RecordingFileTest, NothingIsToldOfWhatIsThere) {

@@ -24,7 +24,7 @@ public:
         _bytes += bytes;
         return *this;
     }
-    /// A pcapng block of this type, its lengths around the body.
+    /// A pcapng block of this type, with its length before and after the body.
     CaptureBytes& block(std::uint32_t type, const CaptureBytes& body) {
         const auto length = static_cast<std::uint32_t>(body._bytes.size() + 12);
         return u32(type).u32(length).text(body._bytes).u32(length);
@@ -66,7 +66,7 @@ constexpr std::uint32_t kMicroseconds = 0xA1B2C3D4;
 constexpr std::uint32_t kNanoseconds = 0xA1B23C4D;
 constexpr std::size_t kPcapHeader = 24;
 
-/// The same as pcapng, its stamps in 10^-`resolution` seconds.
+/// The same as pcapng, with stamps in units of 10^-`resolution` seconds.
 std::string pcapng(unsigned resolution, std::uint64_t stamp) {
     CaptureBytes section;
     section.u32(0x1A2B3C4D).u16(1).u16(0).u32(0xFFFFFFFF).u32(0xFFFFFFFF);
@@ -308,7 +308,7 @@ protected:
 TEST_F(RecordingWriterTest, WritesPcapWithNanosecondStamps) {
     const auto writer = create();
     EXPECT_FALSE(writer->write(kTime, ByteBuffer{'a', 'b', 'c'}));
-    // No flush, no close: whatever is written is in the file.
+    // Without flush or close, everything written is in the file.
     EXPECT_EQ(doubles::contentOf(_folder.file("r.pcap")), CaptureBytes()
                                                               .u32(kNanoseconds)
                                                               .u16(2)

@@ -31,7 +31,7 @@ TEST_F(SocketDirectoryTest, IsMadeForItsUserAlone) {
     struct stat status {};
     ASSERT_EQ(::stat(directory->path().c_str(), &status), 0);
     EXPECT_EQ(status.st_mode & 07777U, 0700U);
-    EXPECT_EQ(refusal(), ""); // the second time it is there
+    EXPECT_EQ(refusal(), ""); // it exists the second time
 }
 
 TEST_F(SocketDirectoryTest, AFolderThatOthersMayEnterIsRefused) {
@@ -106,7 +106,7 @@ TEST_F(SocketDirectoryTest, ALockThatAnotherKeepsIsWaitedForOnlyForAWhile) {
         const Descriptor kept = directory->lock();
         ASSERT_TRUE(kept);
         EXPECT_FALSE(directory->lock());
-        directory->removeStaleSockets(); // which needs the lock, and leaves them
+        directory->removeStaleSockets(); // cannot get the lock, so it removes nothing
     }
     EXPECT_TRUE(directory->lock());
 }
@@ -115,7 +115,7 @@ TEST_F(SocketDirectoryTest, OnlySocketsThatNobodyListensOnAreRemoved) {
     const auto directory = SocketDirectory::open();
     ASSERT_TRUE(directory);
     const Descriptor living = listenAt(*directory->socketPath("living"));
-    (void)listenAt(*directory->socketPath("stale")); // closed at once, the file stays
+    (void)listenAt(*directory->socketPath("stale")); // closed at once, but the file remains
     ASSERT_EQ(_folder.socketCount(), 2U);
     directory->removeStaleSockets();
     EXPECT_EQ(listenerAt(*directory->socketPath("living")), Listener::Living);

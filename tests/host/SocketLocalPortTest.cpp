@@ -38,7 +38,7 @@ protected:
         const ByteBuffer data = bytesOf(text);
         return port.sendRequest({identifier, data, 1s, 0s, false}).error;
     }
-    /// True once the peer has cut the raw connection off.
+    /// True after the peer has closed the raw connection.
     bool isCutOff(const Descriptor& socket) {
         return runUntil(_queue, [&] {
             std::array<std::uint8_t, 64> buffer{};
@@ -102,11 +102,11 @@ TEST_F(SocketLocalPortTest, ANameInUseIsToldAndTheNewPortIsInert) {
     second.port->invalidate();
     EXPECT_FALSE(called);
     second.port.reset();
-    EXPECT_NE(_ports.createRemote("a.port"), nullptr); // the living port is as it was
+    EXPECT_NE(_ports.createRemote("a.port"), nullptr); // the living port is unaffected
 }
 
 TEST_F(SocketLocalPortTest, AStaleFileIsReplaced) {
-    (void)listenAt(socketPath("a.port")); // closed at once, the file stays
+    (void)listenAt(socketPath("a.port")); // closed at once, but the file remains
     const auto local = open("a.port", collect());
     EXPECT_TRUE(local->isValid());
     EXPECT_NE(_ports.createRemote("a.port"), nullptr);
@@ -161,7 +161,7 @@ TEST_F(SocketLocalPortTest, TheInvalidationCallbackMayDestroyThePort) {
 
 TEST_F(SocketLocalPortTest, TheReceiveCallbackMayDestroyThePort) {
     std::unique_ptr<LocalMessagePort> local;
-    std::string seen; // held by the callback itself, which must live to its end
+    std::string seen; // owned by the callback, which must live until it returns
     local = open(
         "a.port",
         [&, kept = std::string(100, 'k')](std::int32_t, Bytes data) -> std::optional<ByteBuffer> {
@@ -221,7 +221,7 @@ TEST_F(SocketLocalPortTest, APeerOfAnotherUserIsRefused) {
     const std::string path = socketPath("a.port");
     const pid_t child = ::fork();
     if (child == 0) {
-        // Another user to the socket, but still able to reach its file.
+        // The socket sees another user, who can still reach its file.
         const bool changed = ::seteuid(12345) == 0;
         (void)::setfsuid(0);
         sockaddr_un address{};
@@ -232,7 +232,7 @@ TEST_F(SocketLocalPortTest, APeerOfAnotherUserIsRefused) {
         const bool connected =
             ::connect(socket.number(), static_cast<const sockaddr*>(generic), sizeof address) == 0;
         std::uint8_t byte = 0;
-        const bool ended = ::read(socket.number(), &byte, 1) <= 0; // closed without a word
+        const bool ended = ::read(socket.number(), &byte, 1) <= 0; // closed without an answer
         ::_exit(changed && connected && ended ? 0 : 1);
     }
     int status = -1;
@@ -251,7 +251,7 @@ TEST_F(SocketLocalPortTest, ASlowReceiverStopsTheSenderAndNothingIsBuffered) {
     for (int count = 0; count < 1000; ++count) {
         appendFrame(stream, {}, ByteBuffer(1000));
     }
-    // One block of the queue for every attempt to send: the receiver takes little at a time.
+    // Each attempt to send runs in its own block, because the receiver takes little at a time.
     std::size_t sent = 0;
     std::size_t mostAhead = 0;
     const auto step = [&] {
@@ -266,7 +266,7 @@ TEST_F(SocketLocalPortTest, ASlowReceiverStopsTheSenderAndNothingIsBuffered) {
         return received > std::size_t{8} << 20U;
     };
     EXPECT_TRUE(runUntil(_queue, step));
-    // Two socket buffers and a chunk, with the kernel's own generosity; not megabytes.
+    // Two socket buffers and a chunk, which the kernel may enlarge; not megabytes.
     EXPECT_LT(mostAhead, std::size_t{1} << 20U);
 }
 

@@ -25,7 +25,7 @@ protected:
         local.port->setDispatchQueue(_queue);
         return std::move(local.port);
     }
-    /// Whether a message goes from one end to the other.
+    /// Whether a message arrives at the other end.
     bool carries(SocketMessagePorts& ports, std::string_view name) {
         const auto remote = ports.createRemote(name);
         const std::size_t before = _received.size();
@@ -52,7 +52,7 @@ TEST_F(SocketMessagePortsTest, WorkInAFolderWhosePathIsTooLongForASocket) {
 }
 
 TEST_F(SocketMessagePortsTest, APeerThatKeepsTheLockKeepsNobodyOut) {
-    (void)listenAt(socketPath("stale")); // closed at once, the file stays
+    (void)listenAt(socketPath("stale")); // closed at once, but the file remains
     const Descriptor kept = _ports.directory().lock();
     ASSERT_TRUE(kept);
     const auto fresh = open(_ports, "fresh");
@@ -62,7 +62,7 @@ TEST_F(SocketMessagePortsTest, APeerThatKeepsTheLockKeepsNobodyOut) {
     ASSERT_NE(again, nullptr) << _ports.lastError();
     EXPECT_TRUE(carries(_ports, "stale"));
     EXPECT_TRUE(_ports.createLocal("fresh", {}).alreadyExisted);
-    EXPECT_EQ(_folder.socketCount(), 2U) << "nothing that was moved aside is left";
+    EXPECT_EQ(_folder.socketCount(), 2U) << "no moved socket remains";
     again->invalidate();
     fresh->invalidate();
     EXPECT_EQ(_folder.socketCount(), 0U);
@@ -72,7 +72,7 @@ TEST_F(SocketMessagePortsTest, ANameIsTakenAlsoByAPortThatTakesNoConnectionNow) 
     EXPECT_FALSE(_ports.isTaken("port"));
     Descriptor listener = listenAt(socketPath("port")); // accepts nothing
     std::vector<std::unique_ptr<RemoteMessagePort>> waiting;
-    do { // until no other connection can wait
+    do { // until no further connection can wait
         waiting.push_back(_ports.createRemote("port"));
     } while (waiting.back() != nullptr);
     EXPECT_TRUE(_ports.isTaken("port"));

@@ -14,7 +14,7 @@ using doubles::PortTest;
 using doubles::runUntil;
 using namespace std::chrono_literals;
 
-/// The local port runs on a queue of its own, as in another process.
+/// The local port runs on its own queue, as in another process.
 class SocketRemotePortTest : public PortTest {
 protected:
     void serve(MessagePorts::ReceiveCallback receive) {
@@ -74,7 +74,7 @@ TEST_F(SocketRemotePortTest, WithoutAwaitReplyNoReplyComes) {
     const auto outcome = _remote->sendRequest({3, {}, 1s, 5s, false});
     EXPECT_EQ(outcome.error, SendError::None);
     EXPECT_EQ(outcome.reply, std::nullopt);
-    EXPECT_EQ(ask("next", 5s).reply, ByteBuffer{1}); // and it disturbs nothing later
+    EXPECT_EQ(ask("next", 5s).reply, ByteBuffer{1}); // a later request works
     EXPECT_EQ(calls, 2);
 }
 
@@ -171,7 +171,7 @@ TEST_F(SocketRemotePortTest, ThePeersEndInvalidatesAndCallsBackAsABlock) {
     _server.end();
     _local.reset();
     ASSERT_TRUE(runUntil(_queue, [&] { return calls > 0; }));
-    _remote->invalidate(); // does nothing any more
+    _remote->invalidate(); // has no effect
     _queue.runReady();
     EXPECT_EQ(calls, 1);
     EXPECT_EQ(ask("too late", 5s).error, SendError::InvalidPort);
@@ -189,7 +189,7 @@ TEST_F(SocketRemotePortTest, ThePeersEndDuringARequestIsAnInvalidPort) {
     EXPECT_EQ(remote->sendRequest({0, {}, 1s, 10s, true}).error, SendError::InvalidPort);
     peer.join();
     EXPECT_FALSE(remote->isValid());
-    EXPECT_FALSE(called); // only as a block
+    EXPECT_FALSE(called); // only in a block of the queue
     _queue.runReady();
     EXPECT_TRUE(called);
 }
@@ -198,7 +198,7 @@ TEST_F(SocketRemotePortTest, APeerThatSendsNoReplyFrameIsCutOff) {
     const Descriptor listener = listenAt(socketPath("wrong"));
     const auto remote = _ports.createRemote("wrong");
     const Descriptor accepted = acceptFrom(listener);
-    (void)sendTo(accepted, encodeHeader({}, 0)); // a message, to a port that only asks
+    (void)sendTo(accepted, encodeHeader({}, 0)); // a message, to a port that can only send requests
     ASSERT_TRUE(runUntil(_queue, [&] { return !remote->isValid(); }));
 }
 
@@ -208,7 +208,7 @@ TEST_F(SocketRemotePortTest, APeerThatNeverStopsAnsweringKeepsNoDeadlineWaiting)
     const Descriptor accepted = acceptFrom(listener);
     std::atomic<bool> ended = false;
     std::thread flood([&] {
-        ByteBuffer noReplies; // to a request that nobody has sent
+        ByteBuffer noReplies; // to a request that was never sent
         for (int count = 0; count < 1000; ++count) {
             appendFrame(noReplies, {FrameKind::NoReply, 0, 77, std::nullopt}, {});
         }
@@ -227,7 +227,7 @@ TEST_F(SocketRemotePortTest, APeerThatNeverStopsAnsweringKeepsNoDeadlineWaiting)
     _queue.run();
     EXPECT_TRUE(queueGoesOn);
     ended = true;
-    remote.reset(); // nobody reads any more, so that no sending waits
+    remote.reset(); // removes the reader, so that no send waits
     flood.join();
     EXPECT_EQ(outcome.error, SendError::ReplyTimedOut);
     EXPECT_LT(taken, 5s);

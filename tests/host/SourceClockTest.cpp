@@ -18,7 +18,7 @@ protected:
     static Time at(std::chrono::nanoseconds sinceStart) {
         return Time(std::chrono::seconds(1'000'000)) + sinceStart;
     }
-    /// Advances as a port does: step by step until the time is reached.
+    /// Advances like a port: step by step until the time is reached.
     void reach(std::chrono::nanoseconds sinceStart) {
         while (_clock.advance(at(sinceStart))) {
         }
@@ -32,7 +32,7 @@ protected:
     doubles::SteppedQueue _queue;
     SourceClock _clock{_wall, _queue,
                        [this] { return std::chrono::steady_clock::time_point(_queue.now()); }};
-    std::vector<std::chrono::nanoseconds> _ticks; // when, by the clock, since at(0)
+    std::vector<std::chrono::nanoseconds> _ticks; // the clock's times of the ticks, since at(0)
 };
 
 using Ticks = std::vector<std::chrono::nanoseconds>;
@@ -245,7 +245,7 @@ TEST_F(SourceClockTest, ALiveSourcesStampsMoveNeitherClockNorTimers) {
     for (int step = 0; step < 20; ++step) { // ten seconds
         _wall.advance(500ms);
         _queue.advance(500ms);
-        reach(-3600s); // a clock that was set back, and stands
+        reach(-3600s); // a clock that was set back and stopped
     }
     EXPECT_EQ(_ticks.size(), 5U);
     _wall.advance(5s); // a pause

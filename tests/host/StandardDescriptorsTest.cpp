@@ -14,7 +14,7 @@
 namespace pallax {
 namespace {
 
-/// What a child process, which may close what it likes, makes of it.
+/// Evaluates the condition in a child process, which may close descriptors.
 bool holdsInChild(const std::function<bool()>& condition) {
     const pid_t child = ::fork();
     if (child == 0) {

@@ -11,7 +11,7 @@
 namespace pallax {
 namespace {
 
-/// A folder whose path alone is longer than a socket's address.
+/// A folder whose path alone is longer than a socket address.
 class UnixSocketTest : public testing::Test {
 protected:
     UnixSocketTest() { std::filesystem::create_directories(folder); }
@@ -27,7 +27,7 @@ TEST_F(UnixSocketTest, APathOfAnyLengthIsListenedAtAndConnectedTo) {
     ASSERT_TRUE(listener);
     EXPECT_TRUE(std::filesystem::is_socket(path));
     EXPECT_EQ(listenerAt(path), Listener::Living);
-    (void)acceptFrom(listener); // the look at it
+    (void)acceptFrom(listener); // the probe's connection
     const Descriptor near = connectTo(path);
     ASSERT_TRUE(near);
     const Descriptor far = acceptFrom(listener);

@@ -14,7 +14,7 @@ namespace {
 constexpr const char* kFixedName = "com.norvane.BasebandStateReport.LogChannel";
 constexpr const char* kOwnName = "own";
 
-/// The fake ports, with names that living ports of others have.
+/// The fake ports; other processes have living ports with the names in `taken`.
 class CrowdedPorts final : public MessagePorts {
 public:
     explicit CrowdedPorts(doubles::FakePorts& ports) : _ports(ports) {}
@@ -33,7 +33,7 @@ private:
     doubles::FakePorts& _ports;
 };
 
-/// A model whose link goes over the ports.
+/// A model whose link uses LinkPorts.
 class LinkPortsTest : public doubles::ModelFixture {
 protected:
     LinkPortsTest() {
@@ -43,7 +43,7 @@ protected:
             observer);
     }
 
-    /// The lines of priority 3 of a start that fails.
+    /// Makes a start that must fail; its lines of priority 3.
     Diary failedStart() {
         (void)errors();
         _model->startMonitor();
@@ -51,7 +51,7 @@ protected:
         return errors();
     }
 
-    /// The log channels that were asked for.
+    /// The requested log channels.
     Diary channels() const {
         Diary asked;
         std::copy_if(linkDiary.begin(), linkDiary.end(), std::back_inserter(asked),
@@ -81,7 +81,7 @@ TEST_F(LinkPortsTest, WhereTheFixedNameIsTakenTheNextViewerHasANameOfItsOwn) {
     EXPECT_EQ(channels(), Diary{"channel own"});
     const Diary lines = errors();
     EXPECT_EQ(std::count(lines.begin(), lines.end(), "Local messsage port already exists"), 0);
-    ports.deliver({1}); // to the model, over its own name
+    ports.deliver({1}); // to the model, through its own name
     queue.runReady();
     EXPECT_EQ(ports.replies().size(), 1U);
 }

@@ -111,7 +111,7 @@ TEST_F(SettingsFileTest, WhatCannotBeLookedAtIsNotMissing) {
     EXPECT_EQ(settings.error().sentence, circle + "/pallax.conf cannot be read: Too many levels "
                                                   "of symbolic links.");
     EXPECT_TRUE(loadSettings({file + "/pallax.conf", folder.path("none/pallax.conf")}))
-        << "below a file there can be none";
+        << "a file has no files below it";
 }
 
 TEST_F(SettingsFileTest, AFolderThatMayNotBeEnteredIsAnError) {

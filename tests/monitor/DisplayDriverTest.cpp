@@ -34,7 +34,7 @@ TEST_F(DisplayDriverTest, WithoutAGeneratorPacketsAreLostAndNothingIsShown) {
     EXPECT_FALSE(driver.keepsDisplay());
     EXPECT_FALSE(driver.takeUpdated());
     driver.update({});
-    EXPECT_TRUE(driver.takeUpdated()) << "it counts as new data all the same";
+    EXPECT_TRUE(driver.takeUpdated()) << "it still counts as new data";
     EXPECT_TRUE(driver.generate().isNull());
     EXPECT_TRUE(driver.display().isNull());
     EXPECT_TRUE(driver.saveContents().isNull());
@@ -58,14 +58,14 @@ TEST_F(DisplayDriverTest, APacketWhoseRecordThrowsIsNoNewData) {
 TEST_F(DisplayDriverTest, TheLiveDisplayIsCaughtUpAndNotGenerated) {
     FakeGenerator& generator = setGenerator();
     generator.display = "shown";
-    EXPECT_TRUE(driver.display().isNull()) << "no tick has made it";
+    EXPECT_TRUE(driver.display().isNull()) << "no tick has made a display";
     EXPECT_EQ(driver.generate(), PropertyList("shown"));
     EXPECT_EQ(driver.display(), PropertyList("shown"));
     EXPECT_EQ(generator.caughtUp, 2);
     EXPECT_EQ(generator.displaysMade, 1);
 }
 
-/// Counts on its way out what it was asked until then.
+/// On destruction, stores how often it was brought up to date.
 class CountedGenerator final : public FakeGenerator {
 public:
     CountedGenerator(const GeneratorEnvironment& environment, int& asked)

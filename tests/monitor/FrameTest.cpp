@@ -26,7 +26,7 @@ protected:
         NodeRef root = PallaxModelNode::makeTreeFromObject(display, *paths);
         return {std::move(root), paths, time};
     }
-    /// The next frame, so many seconds after the first tick.
+    /// The next frame, `second` seconds after the first tick.
     void show(const PropertyList& display, int second) {
         frame = std::make_shared<Frame>(pictureOf(display, kFirstTick + seconds(second)),
                                         frame.get(), hasAges ? &ages : nullptr);
@@ -34,7 +34,7 @@ protected:
     const Frame::Stamp& stamp(const std::string& path) const {
         return frame->stamp(*frame->nodeAtPath(path));
     }
-    /// Seconds after the first tick.
+    /// The time of the value's first frame, in seconds after the first tick.
     std::int64_t since(const std::string& path) const {
         return std::chrono::duration_cast<seconds>(stamp(path).since - kFirstTick).count();
     }
@@ -72,7 +72,7 @@ TEST_F(FrameTest, AValueThatChangesIsMarkedWithTheBranchesAboveIt) {
     show(Dictionary{{"A", "1"}, {"B", Dictionary{{"C", "4"}, {"D", "3"}}}}, 4);
     EXPECT_EQ(frame->changed(), Paths{});
     EXPECT_FALSE(stamp("/B").isChanged);
-    EXPECT_EQ(since("/B/C"), 2) << "when it changed, not when it was seen again";
+    EXPECT_EQ(since("/B/C"), 2) << "the time of the change, not of the latest frame";
     EXPECT_EQ(since("/B"), 2);
     EXPECT_EQ(since("/"), 2);
     EXPECT_EQ(since("/B/D"), 0);
@@ -95,10 +95,10 @@ TEST_F(FrameTest, WhatIsNewIsChangedAndWhatHasGoneIsToldWithoutWhatStoodBelow) {
     EXPECT_EQ(frame->changed(), Paths{"/E/F"});
     EXPECT_EQ(frame->gone(), Paths{"/A"});
     EXPECT_TRUE(stamp("/E").isChanged);
-    EXPECT_FALSE(stamp("/D").isChanged) << "in another place, under the same name";
+    EXPECT_FALSE(stamp("/D").isChanged) << "moved, with the same name";
     show(Dictionary{{"E", Dictionary{}}, {"D", "3"}}, 4);
     EXPECT_EQ(frame->gone(), Paths{"/E/F"});
-    EXPECT_TRUE(stamp("/E").isChanged) << "there is less below it";
+    EXPECT_TRUE(stamp("/E").isChanged) << "it has fewer nodes below";
     EXPECT_EQ(since("/E"), 4);
 }
 
@@ -124,12 +124,12 @@ TEST_F(FrameTest, RowsOfOneNameAreComparedInTheirOrder) {
     EXPECT_FALSE(frame->stamp(*rows[0]).isChanged);
     EXPECT_TRUE(frame->stamp(*rows[1]).isChanged);
     show(Dictionary{{"_sorted", "1"}, {"0;New", ""}, {"1;Cell", "a"}, {"2;Cell", "c"}}, 4);
-    EXPECT_EQ(frame->changed(), Paths{"/New"}) << "both stand a place further down";
+    EXPECT_EQ(frame->changed(), Paths{"/New"}) << "the others have only moved down";
     show(Dictionary{{"_sorted", "1"}, {"1;Cell", "a"}}, 6);
     EXPECT_EQ(frame->gone(), (Paths{"/New", "/Cell"}));
     show(Dictionary{{"_sorted", "1"}, {"1;Cell", "a"}, {"2;New", ""}, {"3;Cell", "c"}}, 8);
     show(Dictionary{{"_sorted", "1"}, {"1;Cell", "a"}, {"3;Cell", "c"}}, 10);
-    EXPECT_EQ(frame->changed(), Paths{}) << "the second is not compared with the first";
+    EXPECT_EQ(frame->changed(), Paths{}) << "not compared with the first of that name";
     EXPECT_EQ(frame->gone(), Paths{"/New"});
 }
 
@@ -158,16 +158,16 @@ TEST_F(FrameTest, AValueIsAsOldAsItsLatestReading) {
     hasAges = true;
     ages.note("/A", kFirstTick + seconds(1));
     show(Dictionary{{"A", Dictionary{{"B", "1"}}}, {"C", Dictionary{{"D", "2"}}}}, 2);
-    EXPECT_EQ(age("/A/B"), 1) << "as the section";
+    EXPECT_EQ(age("/A/B"), 1) << "the section's age";
     EXPECT_EQ(age("/A"), 1);
-    EXPECT_EQ(age("/"), 1) << "as the latest below";
+    EXPECT_EQ(age("/"), 1) << "the latest age below";
     EXPECT_EQ(stamp("/C/D").read, std::nullopt);
     EXPECT_EQ(age("/C/D"), 0) << "since it changed";
     ages.note("/A", kFirstTick + seconds(9));
     ages.note("/A/B", kFirstTick + seconds(4));
     show(Dictionary{{"A", Dictionary{{"B", "1"}}}, {"C", Dictionary{{"D", "2"}}}}, 10);
     EXPECT_EQ(frame->changed(), Paths{});
-    EXPECT_EQ(age("/A/B"), 6) << "an answer of its own";
+    EXPECT_EQ(age("/A/B"), 6) << "its own time";
     EXPECT_EQ(age("/A"), 1);
     EXPECT_EQ(since("/A/B"), 2);
     EXPECT_EQ(age("/C/D"), 8);
@@ -200,7 +200,7 @@ TEST_F(FrameTest, SharesNoContainerWithTheDisplay) {
     const auto display =
         std::make_shared<Dictionary>(Dictionary{{"Section", section}, {"List", list}});
     show(display, 0);
-    EXPECT_EQ(section.use_count(), 2) << "the display's and the test's";
+    EXPECT_EQ(section.use_count(), 2) << "owned by the display and the test";
     EXPECT_EQ(list.use_count(), 2);
     EXPECT_EQ(display.use_count(), 1);
     section->set("A", "2");
@@ -209,7 +209,7 @@ TEST_F(FrameTest, SharesNoContainerWithTheDisplay) {
     EXPECT_EQ(frame->nodeAtPath("/List/1/B")->value()->string(), "b");
 }
 
-/// Few names and few texts, so that two displays have much in common.
+/// A display of few names and texts, so that two displays have much in common.
 PropertyList anyDisplay(int depth) {
     using doubles::any::between;
     const int kind = depth == 0 ? 0 : between(0, 5);
@@ -231,7 +231,7 @@ PropertyList anyDisplay(int depth) {
     return entries;
 }
 
-/// Path to text of each leaf, path to nothing of each branch.
+/// Each leaf's path with its text, and each branch's path with nothing.
 using Shown = std::map<std::string, std::optional<std::string>>;
 
 void collect(const PallaxModelNode& node, const std::string& path, Shown& shown) {

@@ -8,7 +8,7 @@ namespace {
 using namespace std::chrono_literals;
 using doubles::FakeGenerator;
 
-/// A link without a model: what a client hears, among the log lines.
+/// A link without a model. The calls of its client appear among the log lines.
 class ModemLinkTest : public doubles::ModelFixture, public ModemLinkClient {
 protected:
     ModemLinkTest() { model.reset(); }
@@ -125,7 +125,7 @@ TEST_F(ModemLinkTest, AModemThatHasGoneIsFoundAtTheTickAndTheLinkStartsAnew) {
     ports.endRemote();
     queue.advance(2s);
     EXPECT_EQ(starts(), 2U);
-    EXPECT_EQ(ticks, 1) << "behind the restart";
+    EXPECT_EQ(ticks, 1) << "after the restart";
     EXPECT_TRUE(link->isConnected());
 }
 

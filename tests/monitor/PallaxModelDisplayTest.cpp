@@ -52,14 +52,14 @@ TEST_F(PallaxModelDisplayTest, NewDataDropsTheTreeAtTheNextRefresh) {
     const NodeRef first = model->topLevelNodes();
     generator().display = Dictionary{{"B", "2"}};
     model->updateWithData({});
-    EXPECT_EQ(model->topLevelNodes(), first); // the cache holds until the refresh
+    EXPECT_EQ(model->topLevelNodes(), first); // cached until the refresh
     EXPECT_NE(model->nodeAtPath("/A"), nullptr);
     model->refresh();
     const NodeRef second = model->topLevelNodes();
     EXPECT_NE(second, first);
     EXPECT_EQ(model->nodeAtPath("/A"), nullptr);
     EXPECT_EQ(model->nodeAtPath("/B")->value()->string(), "2");
-    EXPECT_EQ(first->childNodes()->front()->displayName(), "A"); // whoever holds it keeps it
+    EXPECT_EQ(first->childNodes()->front()->displayName(), "A"); // its owners keep it
 }
 
 TEST_F(PallaxModelDisplayTest, TopLevelNodesAreBuiltOnceAndCached) {
@@ -104,7 +104,7 @@ TEST_F(PallaxModelDisplayTest, AGeneratorWithoutADisplayGivesNoTreeAndIsAskedOnc
     start();
     EXPECT_EQ(model->topLevelNodes(), nullptr);
     EXPECT_EQ(model->topLevelNodes(), nullptr);
-    EXPECT_EQ(model->nodeAtPath("/"), nullptr); // the paths are there, and empty
+    EXPECT_EQ(model->nodeAtPath("/"), nullptr); // the paths exist, but are empty
     EXPECT_EQ(generator().displaysMade, 1);
     generator().display = Dictionary{};
     ports.deliver({1});
@@ -135,7 +135,7 @@ TEST_F(PallaxModelDisplayTest, SaveContentsComeFromTheGeneratorWithTheModelsStat
               PropertyList(Array{Dictionary{{"Display", Dictionary{{"A", "1"}}}}}));
     EXPECT_EQ(generator().caughtUp, 0);
     EXPECT_EQ(model->display(), PropertyList(Dictionary{{"A", "1"}}));
-    EXPECT_EQ(generator().caughtUp, 1) << "what is saved shares its sections with the display";
+    EXPECT_EQ(generator().caughtUp, 1) << "the save contents share the display's sections";
 }
 
 } // namespace

@@ -14,7 +14,7 @@ protected:
     bool asked(const std::string& what) const {
         return std::find(linkDiary.begin(), linkDiary.end(), what) != linkDiary.end();
     }
-    /// Both ports are gone, and the next start is tried 5 seconds later.
+    /// Checks that both ports are closed and the next start follows 5 seconds later.
     void expectTeardownAndRetry() {
         EXPECT_EQ(ports.local(), nullptr);
         EXPECT_EQ(ports.remote(), nullptr);
@@ -33,7 +33,7 @@ TEST_F(PallaxModelFailureTest, ALocalPortThatCannotBeMadeFailsTheStart) {
 TEST_F(PallaxModelFailureTest, LocalPortNameAlreadyInUseFailsCreatePortsAndIsRetriedAfter5s) {
     ports.localExists = true;
     EXPECT_FALSE(model->createPorts());
-    EXPECT_NE(ports.local(), nullptr); // the handle is stored all the same
+    EXPECT_NE(ports.local(), nullptr); // the handle is stored anyway
     EXPECT_EQ(errors(), Diary{"Local messsage port already exists"});
     model->destroyPorts();
     start();

@@ -49,7 +49,7 @@ protected:
         model->observeFrames(frames);
         return frames;
     }
-    /// One packet, which changes the display to `display`, and the next tick.
+    /// Receives a packet that changes the display to `display`, up to the next tick.
     void tick(const PropertyList& display) {
         ports.deliver({1});
         queue.runReady();
@@ -97,7 +97,7 @@ TEST_F(PallaxModelFramesTest, WithoutAnObserverNothingIsBuilt) {
     frames.reset();
     tick(Dictionary{{"A", "2"}});
     EXPECT_EQ(generator().displaysMade, 1);
-    EXPECT_TRUE(last.expired()) << "the model keeps no frame for those to come";
+    EXPECT_TRUE(last.expired()) << "the model keeps no frame for later observers";
     const auto later = observe();
     tick(Dictionary{{"A", "3"}});
     EXPECT_EQ(later->frames.back()->number(), 1U);
@@ -162,7 +162,7 @@ TEST_F(PallaxModelFramesTest, TheModelMayEndInsideTheViewUpdateOrAFrame) {
     frames->onFrame = [this] { model.reset(); };
     tick(Dictionary{{"A", "1"}});
     EXPECT_EQ(frames->frames.size(), 1U);
-    EXPECT_EQ(second->frames, frames->frames) << "they have been told of the same tick";
+    EXPECT_EQ(second->frames, frames->frames) << "both get the frame of the same tick";
 }
 
 TEST_F(PallaxModelFramesTest, AnObserverMayAskForAnotherOneWithinAFrame) {

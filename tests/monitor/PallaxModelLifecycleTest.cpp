@@ -71,8 +71,8 @@ TEST_F(PallaxModelLifecycleTest, ARefreshThatFindsTheSendPortGoneRestartsTheMoni
     errors();
     const std::string ended = invalidated(ports.local());
     ports.endRemote();
-    EXPECT_TRUE(log.lines().empty()); // the remote port has no invalidation handler
-    queue.advance(2s);                // the timer dies inside its own action
+    EXPECT_TRUE(log.lines().empty()); // the remote port has no invalidation callback
+    queue.advance(2s);                // the timer is destroyed in its own action
     EXPECT_EQ(errors(),
               (Diary{ended, createdPorts(), gotGenerator(), "Starting the display update timer"}));
     EXPECT_EQ(starts(), 2U);
@@ -162,7 +162,7 @@ TEST_F(PallaxModelLifecycleTest, TheObserverIsToldOfEachGeneratorAndOfADisplayTh
     EXPECT_EQ(observer.generators, (Told{"Fake", "Fake", "Fake, keeps the display"}));
     reply = technology("Unknown");
     ports.endLocal();
-    EXPECT_EQ(observer.generators.size(), 3U) << "no generator is in place";
+    EXPECT_EQ(observer.generators.size(), 3U) << "no generator was made";
     reply = {SendError::ReplyTimedOut, std::nullopt};
     queue.advance(PallaxModel::kRetryDelay);
     EXPECT_EQ(observer.generators.size(), 3U);
@@ -172,7 +172,7 @@ TEST_F(PallaxModelLifecycleTest, TheStateSurvivesRestarts) {
     start();
     generator().display = Dictionary{{"Serving", "1"}};
     ASSERT_NE(model->topLevelNodes(), nullptr);
-    ports.endLocal(); // the new generator works on the same state
+    ports.endLocal(); // the new generator uses the same state
     model->updateWithData({});
     model->refresh();
     ASSERT_NE(model->nodeAtPath("/Serving"), nullptr);

@@ -92,7 +92,7 @@ TEST_F(PallaxModelStartTest, ARestartTakesANewGeneratorAndLetsTheOldOneGo) {
     start();
     const FakeGenerator* first = &generator();
     model->restartMonitor();
-    EXPECT_NE(&generator(), first); // the new one was made while the old one lived
+    EXPECT_NE(&generator(), first); // made while the old one still existed
     EXPECT_EQ(FakeGenerator::living.size(), 1U);
     EXPECT_EQ(errors().at(4), gotGenerator());
 }
@@ -114,7 +114,7 @@ TEST_F(PallaxModelStartTest, ConnectedMeansThatBothPortsAreSet) {
     EXPECT_FALSE(model->isConnected());
     ports.failRemote = true;
     EXPECT_FALSE(model->createPorts());
-    EXPECT_FALSE(model->isConnected()); // the local port alone
+    EXPECT_FALSE(model->isConnected()); // only the local port exists
     EXPECT_NE(ports.local(), nullptr);
 }
 

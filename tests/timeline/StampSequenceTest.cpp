@@ -15,7 +15,7 @@ using Kind = StampRemark::Kind;
 
 constexpr Time kStart{std::chrono::seconds(1700000000)};
 
-/// Takes stamps, which are given as times since kStart.
+/// A sequence that has taken these stamps, given as times since kStart.
 StampSequence sequenceOf(const std::vector<std::chrono::nanoseconds>& stamps) {
     StampSequence sequence;
     for (const auto stamp : stamps) {
@@ -82,7 +82,7 @@ TEST(StampSequenceProperty, NoStampOfAStretchLiesFarBeforeTheLatestAndStretchesB
             const bool back = !isFirst && stamp < latest - 2s;
             RC_ASSERT(sequence.wouldStepBack(stamp) == back);
             const auto told = sequence.stepTo(stamp);
-            RC_ASSERT(told.has_value() == back); // no gap: no step is that long
+            RC_ASSERT(told.has_value() == back); // no gaps, because the steps are short
             if (told) {
                 RC_ASSERT(told->size == latest - stamp);
             }
