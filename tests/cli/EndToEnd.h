@@ -14,7 +14,7 @@
 
 namespace pallax {
 
-/// The real program over recordings that the test writes.
+/// Runs the real program on recordings that the test writes.
 class EndToEnd : public testing::Test {
 protected:
     static constexpr int kGsmLinkType = 148;
@@ -23,7 +23,7 @@ protected:
 
     using Packet = std::pair<std::chrono::milliseconds, ByteBuffer>;
 
-    /// A registration record with its state: 0 is REG_STATE_INACTIVE, 1 REG_STATE_SERVICE_….
+    /// A registration record with this state: 0 is REG_STATE_INACTIVE, 1 REG_STATE_SERVICE_….
     static ByteBuffer registration(unsigned state) {
         return doubles::Record(kRegistration).u8(state).u8(0).u8(0).prefixed();
     }
@@ -33,7 +33,7 @@ protected:
         return doubles::Record(kSimFiles).append({'n', 'o', ' ', '{'}).prefixed();
     }
 
-    /// Writes a recording into the world; its path.
+    /// Writes a recording into the world and returns its path.
     std::string record(const std::string& name, const std::vector<Packet>& packets,
                        int linkType = kGsmLinkType) const {
         const std::string path = world.path(name);

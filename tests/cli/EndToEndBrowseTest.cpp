@@ -29,7 +29,7 @@ std::vector<std::string> headersOf(const std::string& text) {
 
 class EndToEndBrowse : public EndToEnd {
 protected:
-    /// A recording that plays for a minute, a packet every 100 ms.
+    /// A recording that plays for a minute, with a packet every 100 ms.
     std::string minute() const {
         std::vector<Packet> packets;
         for (int count = 0; count < 600; ++count) {
@@ -70,7 +70,7 @@ TEST_F(EndToEndBrowse, TheTicksAreThoseOfDecode) {
     EXPECT_EQ(played.status, 0);
     EXPECT_EQ(static_cast<std::ptrdiff_t>(headersOf(played.out).size()),
               std::count(decoded.out.begin(), decoded.out.end(), '\n'));
-    EXPECT_EQ(played.out, run({recording, "--speed", "max"}).out) << "played twice, printed alike";
+    EXPECT_EQ(played.out, run({recording, "--speed", "max"}).out) << "both runs print the same";
     EXPECT_EQ(played.out, run({"-", "--speed", "max"}, recording).out);
     EXPECT_TRUE(nothingLeft());
 }
@@ -78,7 +78,7 @@ TEST_F(EndToEndBrowse, TheTicksAreThoseOfDecode) {
 TEST_F(EndToEndBrowse, TheSampleShowsThePhoneComeUpUpdateItsLocationAndDetach) {
     const Run played = run({gsmAttach(), "--print", "--speed", "max"});
     EXPECT_EQ(played.status, 0) << played.err;
-    // What each printed tree shows of the two sections, one line for each run of equal ones.
+    // The printed trees' content of the two sections, with one line for each run of equal ones.
     std::map<std::string, std::vector<std::string>> shown;
     std::string section;
     std::istringstream stream(played.out);
@@ -145,7 +145,7 @@ TEST_F(EndToEndBrowse, AKilledViewerTakesItsServiceAlong) {
     }
     EXPECT_TRUE(noChildLeft());
     EXPECT_EQ(run({gsmAttach(), "--speed", "max"}).status, 0);
-    EXPECT_TRUE(nothingLeft()) << "the next run removes what the killed one has left";
+    EXPECT_TRUE(nothingLeft()) << "the next run removes what the killed one left";
 }
 
 TEST_F(EndToEndBrowse, TwoRecordingsCanBeBrowsedAtOnce) {
@@ -178,7 +178,7 @@ TEST_F(EndToEndBrowse, AViewerFindsAServiceThatComesLater) {
     EXPECT_TRUE(viewer.says("<3>Could not create HXServerConnection\n"));
     EXPECT_TRUE(viewer.says("Connecting...\n"));
     PallaxProcess service(world, {"service", "--play", minute(), "--speed", "10"});
-    EXPECT_TRUE(viewer.says("== ")) << "tried again 5 seconds later";
+    EXPECT_TRUE(viewer.says("== ")) << "retried 5 seconds later";
     viewer.signal(SIGTERM);
     EXPECT_EQ(viewer.wait(), 0);
     service.signal(SIGTERM);
@@ -187,7 +187,7 @@ TEST_F(EndToEndBrowse, AViewerFindsAServiceThatComesLater) {
 }
 
 TEST_F(EndToEndBrowse, ARecordThatThrowsEndsTheViewerWithStatus70) {
-    // The second packet is of a code that the viewer does not ask for; it counts all the same.
+    // The viewer does not request the second packet's code, but the packet counts.
     const std::string recording =
         record("a.pcap", {{milliseconds(0), registration(0)},
                           {seconds(1), doubles::Record(0x1234).prefixed()},

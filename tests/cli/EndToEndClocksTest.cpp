@@ -22,10 +22,10 @@ using std::chrono::milliseconds;
 using std::chrono::seconds;
 using Lines = std::vector<std::string>;
 
-/// Recordings whose stamps step.
+/// Recordings whose stamps step back or forward.
 class EndToEndSteps : public EndToEnd {
 protected:
-    /// A record that no GSM viewer asks for.
+    /// A record that GSM viewers do not request.
     static ByteBuffer unwanted() { return doubles::Record(0x0001).u8(0).prefixed(); }
 
     /// "2023-11-14 22:13:22 REG_STATE_INACTIVE" for each tick of `decode`.
@@ -42,7 +42,7 @@ protected:
         }
         return ticks;
     }
-    /// The same of what is printed.
+    /// The same lines from the printed output.
     static Lines printedTicks(const std::string& text) {
         Lines ticks;
         std::istringstream lines(text);
@@ -52,7 +52,7 @@ protected:
             if (line.starts_with("== ")) {
                 ticks.push_back(line.substr(3, line.find(" +0000") - 3) + ":");
             } else if (state != std::string::npos && ticks.back().ends_with(':')) {
-                ticks.back().pop_back(); // the first section that shows it
+                ticks.back().pop_back(); // the first section with this line
                 ticks.back() += " " + line.substr(state + kState.size());
             }
         }
@@ -134,7 +134,7 @@ TEST_F(EndToEndSteps, AtItsOwnPaceARecordingGoesOnAtOnceWhereItsStampsStepBack) 
 }
 
 TEST_F(EndToEndSteps, SecondsAfter2038AndStampsThatAreNoTimesAreTheSameInDecodeAndInPrint) {
-    // 2100-01-01 in pcap, whose seconds have 32 bits; then a fraction of more than a second.
+    // 2100-01-01 in pcap, whose seconds have 32 bits, with a fraction above a second.
     const std::string recording = record("a.pcap", {{seconds(0), registration(0)}});
     std::string bytes = doubles::contentOf(recording);
     constexpr std::size_t kSecondsAt = 24;
@@ -157,7 +157,7 @@ TEST_F(EndToEndSteps, SecondsAfter2038AndStampsThatAreNoTimesAreTheSameInDecodeA
 TEST_F(EndToEndSteps, WhileAPlayedStreamPausesItsClockRunsOn) {
     const std::string pipe = world.path("pipe");
     ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
-    const Descriptor both(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // so that nobody waits
+    const Descriptor both(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // does not wait
     PallaxProcess viewer(world, {"-", "--print"}, pipe);
     const auto writer = RecordingWriter::create(pipe, kGsmLinkType);
     ASSERT_TRUE(writer);
@@ -165,7 +165,7 @@ TEST_F(EndToEndSteps, WhileAPlayedStreamPausesItsClockRunsOn) {
     EXPECT_TRUE(viewer.says("MM Service State: REG_STATE_REGISTERING\n"));
     const std::string shown = viewer.out();
     EXPECT_GE(shown.substr(shown.find("== ")), "== 2023-11-14 22:13:22 +0000\n")
-        << "not the last packet's time";
+        << "not the time of the last packet";
     viewer.signal(SIGTERM);
     EXPECT_EQ(viewer.wait(), 0);
 }
@@ -179,12 +179,12 @@ TEST_F(EndToEndScreen, AStepOfTheStampsIsANoteBesideTheStatus) {
     EXPECT_EQ(terminal.wait(), 0);
 }
 
-/// A live stream, `pallax service --relay -`, whose stamps the test makes.
+/// A live stream, `pallax service --relay -`, with stamps set by the test.
 class EndToEndLiveClock : public EndToEnd {
 protected:
     EndToEndLiveClock() {
         EXPECT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
-        const Descriptor both(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // so that nobody waits
+        const Descriptor both(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // does not wait
         service.emplace(world, Lines{"service", "--relay", "-"}, pipe);
         auto writer = RecordingWriter::create(pipe, kGsmLinkType);
         EXPECT_TRUE(writer);

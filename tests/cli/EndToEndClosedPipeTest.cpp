@@ -15,7 +15,7 @@ namespace {
 
 using doubles::PallaxProcess;
 
-/// Every command that writes data, into a pipe whose reader goes away.
+/// Runs every command that writes data, with a pipe whose reader closes it.
 class EndToEndClosedPipe : public EndToEnd {
 protected:
     EndToEndClosedPipe() {
@@ -23,8 +23,7 @@ protected:
         EXPECT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
     }
 
-    /// A pipe that is full, so that nothing of what the command writes gets into it; then its
-    /// reader goes.
+    /// Runs the command with a full pipe, so that it cannot write anything, then closes the reader.
     void endsQuietly(const std::vector<std::string>& arguments) const {
         SCOPED_TRACE(testing::PrintToString(arguments));
         Descriptor reader(::open(pipe.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));
@@ -36,7 +35,7 @@ protected:
         EXPECT_EQ(process.err(), "");
     }
 
-    /// As `| head -c 100`: the command is under way when its reader goes.
+    /// Closes the reader while the command is writing, as `| head -c 100` does.
     void endsQuietlyAfterTheBeginning(const std::vector<std::string>& arguments) const {
         SCOPED_TRACE(testing::PrintToString(arguments));
         Descriptor reader(::open(pipe.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));

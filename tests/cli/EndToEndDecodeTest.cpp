@@ -218,7 +218,7 @@ TEST_F(EndToEnd, AClosedPipeEndsQuietly) {
     ASSERT_EQ(::mkfifo(fifo.c_str(), 0600), 0);
     std::vector<Packet> packets(5000, {milliseconds(0), registration(1)});
     const std::string recording = record("long.pcap", packets);
-    // Opened first, for the program's own opening waits for a reader.
+    // Opened first, because the program's own opening waits for a reader.
     const int reader = ::open(fifo.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
     ASSERT_GE(reader, 0);
     doubles::PallaxProcess process(world, {"decode", "--every", "packet", recording}, "/dev/null",

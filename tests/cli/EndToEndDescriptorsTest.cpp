@@ -13,10 +13,11 @@ namespace {
 using doubles::contentOf;
 using doubles::PallaxProcess;
 
-/// The real program with descriptors that are closed, or with few of them.
+/// Runs the real program with closed descriptors, or with few of them.
 class EndToEndDescriptors : public EndToEnd {
 protected:
-    /// Runs a line of the shell in which PALLAX stands for the program; its exit status.
+    /// Runs a shell command line, in which PALLAX stands for the program, and returns its exit
+    /// status.
     int shell(std::string line) const {
         const std::string name = "PALLAX";
         std::string program = "env";
@@ -28,7 +29,7 @@ protected:
         const int status = std::system(("cd '" + world.path() + "' && " + line).c_str()); // NOLINT
         return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
     }
-    /// The command with as few descriptors as that.
+    /// Runs the command with at most that many descriptors.
     Run runWithin(rlim_t descriptors, const std::vector<std::string>& arguments) const {
         rlimit before{};
         ::getrlimit(RLIMIT_NOFILE, &before);
@@ -92,7 +93,7 @@ TEST_F(EndToEndDescriptors, AClosedStandardInputIsEmpty) {
     const std::string sentence = "pallax: standard input is empty.\n";
     EXPECT_EQ(shell("PALLAX decode - <&- 2>err"), 1);
     EXPECT_EQ(contentOf(world.path("err")), sentence);
-    EXPECT_EQ(shell("PALLAX - --print <&- 2>err"), 1) << "the child service's is the same";
+    EXPECT_EQ(shell("PALLAX - --print <&- 2>err"), 1) << "the same in the child service";
     EXPECT_EQ(contentOf(world.path("err")), sentence);
     EXPECT_EQ(shell("PALLAX decode - <&- >&- 2>&-"), 1);
 }

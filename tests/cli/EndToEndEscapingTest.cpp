@@ -7,7 +7,7 @@
 namespace pallax {
 namespace {
 
-/// Names, values, settings and options that would command a terminal.
+/// Names, values, settings and options that contain control characters for a terminal.
 class EndToEndEscaping : public EndToEndScreen {
 protected:
     static constexpr int kIfxLinkType = 147;
@@ -21,14 +21,14 @@ protected:
                       kIfxLinkType);
     }
 
-    /// What a program that ends by itself writes on a terminal.
+    /// The terminal output of a program that ends by itself.
     std::string onTerminal(const std::vector<std::string>& arguments, int status) const {
         PallaxTerminal terminal(world, arguments, {.columns = 200});
         EXPECT_EQ(terminal.wait(), status);
         return terminal.bytes();
     }
 
-    /// The first character that commands a terminal, but for its line ends and tabulators.
+    /// The first control character other than line ends and tabs.
     static std::string commandIn(const std::string& bytes) {
         for (std::size_t at = 0; at < bytes.size();) {
             const Utf8CodePoint character = utf8At(bytes, at);
@@ -58,7 +58,7 @@ TEST_F(EndToEndEscaping, DecodedDataCommandsNoTerminal) {
     EXPECT_EQ(json, "{\"Cell\":{\"Operator\":\"\\u001b]0;owned\\u0007\\u009b2J\\u007f"
                     "\\u202E\\u2066\\u061C\",\"ARFCN\":\"12\"}}\r\n");
     const std::string several = onTerminal({"decode", recording, hostile("b.pcap")}, 0);
-    EXPECT_EQ(several, json + json) << "as one after the other";
+    EXPECT_EQ(several, json + json) << "the same as decoding them one by one";
 }
 
 TEST_F(EndToEndEscaping, NoSectionOfATemplateCommandsTheTerminalThatListsItsFields) {

@@ -12,7 +12,7 @@ using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-/// What the application leaves behind at its exits.
+/// The preferences and processes that the application leaves at its exits.
 class EndToEndExit : public EndToEndScreen {
 protected:
     std::string fatal() const {
@@ -92,7 +92,7 @@ TEST_F(EndToEndExit, OfUnreadableSettingsIsOneSentence) {
         EXPECT_EQ(result.err, "pallax: " + file + " cannot be read: it is not a regular file.\n");
     }
     std::filesystem::remove(file);
-    EXPECT_EQ(run({brief(), "--print", "--speed", "max"}).status, 0) << "one that is missing";
+    EXPECT_EQ(run({brief(), "--print", "--speed", "max"}).status, 0) << "it may be missing";
 }
 
 TEST_F(EndToEndExit, OfAPrintedTreeThatNobodyReadsSwitchesThePreferenceOff) {

@@ -24,11 +24,11 @@ using std::chrono::seconds;
 using std::chrono::steady_clock;
 
 constexpr milliseconds kShortRetryDelay{20};
-/// Within so long of the service's return the viewer is to be back in view.
+/// The viewer must show data again this soon after the service's return.
 constexpr seconds kViewerPatience{5};
 
-/// Timers that fire a hundred times as often: a viewer finds at its display tick, every 2 s, that
-/// its service has gone.
+/// Timers that fire a hundred times as often: a viewer checks its service at the display tick,
+/// which is every 2 s.
 class QuickTimers final : public TimerScheduler {
 public:
     explicit QuickTimers(TimerScheduler& timers) : _timers(timers) {}
@@ -41,14 +41,15 @@ private:
     TimerScheduler& _timers;
 };
 
-/// The viewer's side, real but for its screen and its patience: model, ports and sockets.
+/// The viewer's side, with real model, ports and sockets, but without a screen and with short
+/// delays.
 class Viewer final : private ModelObserver {
 public:
     Viewer() : _model(platform(), *this) {
         _link.queue().async([this] { _model.startMonitor(); });
     }
 
-    /// Runs until the condition holds; false when it does not in time.
+    /// Runs until the condition holds; false after the time limit.
     bool runUntil(const std::function<bool()>& condition) {
         const auto end = steady_clock::now() + kViewerPatience;
         while (!condition()) {
@@ -64,7 +65,7 @@ public:
         const auto end = steady_clock::now() + time;
         (void)runUntil([end] { return steady_clock::now() >= end; });
     }
-    /// Waits until new data has been shown, over a link that stands.
+    /// Waits until new data is shown over a working link.
     bool comesIntoView() {
         const int before = _updates;
         return runUntil([&] {
@@ -87,7 +88,7 @@ private:
     }
     void updateViewControllerFromModel() override {
         ++_updates;
-        (void)_model.topLevelNodes(); // as the screen does
+        (void)_model.topLevelNodes(); // like the screen
     }
 
     int _updates = 0;
@@ -114,8 +115,8 @@ protected:
                    line.text.starts_with(text);
         });
     }
-    /// A viewer meets the fault, says one of the lines (the kernel decides between a refused
-    /// connection and one that breaks), and is in view once a service does what it should.
+    /// A viewer meets the fault and logs one of the lines (the kernel decides between a refused and
+    /// a broken connection), then shows data once the service works.
     void meets(Fault fault, const std::vector<std::string>& lines) {
         doubles::RecordingLog log(static_cast<int>(LogPriority::Error));
         std::optional<FaultyService> service(fault);
@@ -129,7 +130,7 @@ protected:
         }
         EXPECT_TRUE(viewer.comesIntoView()) << testing::PrintToString(log.lines());
     }
-    /// As `meets`, of a service that does wrong once and lives.
+    /// The same for a service that fails once and then works.
     void meetsOnce(Fault fault, const std::string& line) {
         doubles::RecordingLog log(static_cast<int>(LogPriority::Error));
         const FaultyService service(fault);
@@ -218,7 +219,7 @@ TEST_F(EndToEndFaults, After200KilledServicesNothingHasLeakedAndTheViewerIsInVie
         Viewer viewer;
         for (int round = 0; round < kRounds; ++round) {
             PallaxProcess service(world, arguments);
-            if (round % 4 == 3) { // killed somewhere on the way
+            if (round % 4 == 3) { // killed at some point during the start
                 viewer.runFor(milliseconds(round % 30));
             } else {
                 ASSERT_TRUE(viewer.comesIntoView()) << "round " << round << "\n" << service.err();
@@ -232,7 +233,7 @@ TEST_F(EndToEndFaults, After200KilledServicesNothingHasLeakedAndTheViewerIsInVie
         }
         viewer.runFor(2 * kShortRetryDelay);
         EXPECT_EQ(openDescriptors(), atFirst);
-        EXPECT_LE(world.sockets().size(), 3U) << "what the last one has left, and the viewer's";
+        EXPECT_LE(world.sockets().size(), 3U) << "those of the last service, and the viewer's";
 
         PallaxProcess service(world, arguments);
         EXPECT_TRUE(viewer.comesIntoView());
@@ -243,7 +244,7 @@ TEST_F(EndToEndFaults, After200KilledServicesNothingHasLeakedAndTheViewerIsInVie
     EXPECT_TRUE(noChildLeft());
 }
 
-/// Every program that needs the folder of sockets refuses it with the same sentence.
+/// All programs that need the socket folder refuse it with the same sentence.
 class EndToEndSocketFolder : public EndToEnd {
 protected:
     void isRefused(const std::string& path, const std::string& why) const {
@@ -277,7 +278,7 @@ TEST_F(EndToEndSocketFolder, WhereAServiceRunsAlreadyASecondOneIsRefused) {
     EXPECT_EQ(second.status, 1);
     EXPECT_EQ(second.err,
               "pallax: A telephony service named com.norvane.telephony is already running.\n");
-    EXPECT_EQ(run({"service", "--status"}).status, 0) << "the first is none the worse";
+    EXPECT_EQ(run({"service", "--status"}).status, 0) << "the first is unaffected";
     first.signal(SIGTERM);
     EXPECT_EQ(first.wait(), 0);
 }

@@ -38,7 +38,7 @@ TEST_F(EndToEnd, FieldsListsEveryTechnologyOrOne) {
     EXPECT_EQ(listed, outputLines(all.out).size());
 }
 
-/// Calls `found` with the path of each value, entries of lists as "*".
+/// Calls `found` with the path of each value, with "*" for list entries.
 void visitValues(const nlohmann::json& value, const std::string& path,
                  const std::set<std::string>& known,
                  const std::function<void(const std::string& path)>& found) {

@@ -14,7 +14,7 @@ using doubles::eventually;
 using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 
-/// A service and a viewer, both real, and a peer that talks to their ports as it likes.
+/// A real service, a real viewer, and a peer that sends arbitrary bytes to their ports.
 class EndToEndGarbage : public EndToEnd {
 protected:
     static constexpr const char* kViewerPort = "com.norvane.BasebandStateReport.LogChannel";
@@ -48,7 +48,7 @@ protected:
         EXPECT_TRUE(socket) << name;
         return socket;
     }
-    /// Sends all of it, as long as the other side takes it.
+    /// Sends all bytes unless the other side closes the connection.
     static void send(const Descriptor& socket, Bytes bytes) {
         constexpr int kMostMilliseconds = 5000;
         while (!bytes.empty()) {
@@ -68,7 +68,7 @@ protected:
         return eventually(
             [&] { return receiveFrom(socket, answer).state == Transfer::State::Closed; });
     }
-    /// New ticks are printed, and the service says that this viewer, alone, is served.
+    /// Whether new ticks are printed and the service reports this viewer as its only client.
     bool goesOn() const {
         const std::size_t shown = viewer->out().size();
         return eventually([&] { return viewer->out().size() > shown; }) && eventually([&] {
@@ -92,7 +92,7 @@ protected:
 };
 
 TEST_F(EndToEndGarbage, APeerThatSendsNoFramesIsCutOff) {
-    std::mt19937 random(8); // the same bytes at every run
+    std::mt19937 random(8); // the same bytes in every run
     for (const char* port : {kViewerPort, kControlPort, kChannelPort}) {
         for (int round = 0; round < 20; ++round) {
             const Descriptor peer = connectToPort(port);
@@ -131,7 +131,7 @@ TEST_F(EndToEndGarbage, MessagesWithoutABodyAreNoRequestAndNoPacket) {
         EXPECT_TRUE(eventually([&] {
             return receiveFrom(peer, answer).state == Transfer::State::Moved;
         })) << port
-            << ": a request is answered, if only with nothing";
+            << ": a request gets an answer, possibly an empty one";
     }
     EXPECT_TRUE(goesOn());
 }
@@ -156,7 +156,7 @@ TEST_F(EndToEndGarbage, AFloodOfMessagesKeepsNobodyElseWaiting) {
 }
 
 TEST_F(EndToEndGarbage, AFloodOfConnectionsIsTakenAndForgotten) {
-    constexpr int kConnections = 200; // more than a socket keeps waiting
+    constexpr int kConnections = 200; // more than a socket's backlog
     for (const char* port : {kViewerPort, kControlPort, kChannelPort}) {
         std::vector<Descriptor> peers;
         for (int count = 0; count < kConnections; ++count) {

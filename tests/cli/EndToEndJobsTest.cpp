@@ -12,14 +12,14 @@ using doubles::contentOf;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-/// `pallax decode` of several recordings at once, held against one by one.
+/// Compares `pallax decode` of several recordings at once with one by one.
 class EndToEndJobs : public EndToEnd {
 protected:
     std::string samplePath(const std::string& name) const {
         return PALLAX_SOURCE_DIR "/samples/" + name;
     }
 
-    /// More recordings than jobs, of which the first takes longest.
+    /// More recordings than jobs; the first one takes longest.
     std::vector<std::string> drives() const {
         return {samplePath("utran-drive.pcap"), samplePath("lte-drive.pcap"),
                 samplePath("cdma-drive.pcap"), samplePath("gsm-attach.pcap"),
@@ -33,7 +33,7 @@ protected:
         return options;
     }
 
-    /// The run with three jobs, after it was found to write what one job writes.
+    /// The run with three jobs, which must write the same as the run with one.
     Run atOnce(std::vector<std::string> options, const std::vector<std::string>& recordings) const {
         options.insert(options.end(), {"--jobs", "1"});
         const Run one = run(decodeOf(options, recordings));

@@ -13,14 +13,14 @@ namespace {
 using doubles::PallaxProcess;
 using std::chrono::seconds;
 
-/// `pallax decode` of a recording that comes through a pipe, whose writer has more to say.
+/// `pallax decode` of a recording that comes through a pipe whose writer is not finished.
 class EndToEndLiveDecode : public EndToEnd {
 protected:
     EndToEndLiveDecode() {
         EXPECT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
-        writer = Descriptor(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // no reader is waited for
+        writer = Descriptor(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // does not wait for a reader
     }
-    /// A packet each 3 s: the second one ends the tick of the first.
+    /// A packet every 3 s: the second one ends the first one's tick.
     std::string packets(unsigned count) const {
         std::vector<Packet> all;
         for (unsigned number = 0; number < count; ++number) {
@@ -32,8 +32,7 @@ protected:
         EXPECT_EQ(::write(writer.number(), bytes.data(), bytes.size()),
                   static_cast<ssize_t>(bytes.size()));
     }
-    /// What the command, which reads the pipe, has written once two packets have come, and then at
-    /// the end.
+    /// Checks the command's output after two packets in the pipe, and at the end.
     void comesInTime(const std::vector<std::string>& arguments, const std::string& input,
                      const std::string& early) {
         const std::string whole = packets(3);
@@ -50,7 +49,7 @@ protected:
         std::replace(ofFile.begin(), ofFile.end(), std::string("-"), world.path("whole.pcap"));
         std::replace(ofFile.begin(), ofFile.end(), pipe, world.path("whole.pcap"));
         (void)packets(3);
-        EXPECT_EQ(process.out(), run(ofFile).out) << "what a file gives";
+        EXPECT_EQ(process.out(), run(ofFile).out) << "the same as from a file";
     }
 
     std::string pipe = world.path("pipe");

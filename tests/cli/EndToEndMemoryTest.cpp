@@ -9,19 +9,19 @@ namespace {
 
 using std::chrono::milliseconds;
 
-/// What `decode` holds in memory at most.
+/// The greatest memory use of `decode`.
 class EndToEndMemory : public EndToEnd {
 protected:
     void SetUp() override {
 #ifdef PALLAX_SANITIZED
-        GTEST_SKIP() << "a sanitizer keeps what was freed";
+        GTEST_SKIP() << "a sanitizer keeps freed memory";
 #endif
         if (std::getenv("PALLAX_TEST_PROGRAM") != nullptr) {
-            GTEST_SKIP() << "the program runs under another";
+            GTEST_SKIP() << "another program runs it";
         }
     }
 
-    /// A drive of so many seconds, fifty packets in each.
+    /// A drive of that length, with fifty packets each second.
     std::string drive(const std::string& length) const {
         const std::string path = world.path(length + ".pcap");
         EXPECT_EQ(run({"simulate", "gsm", "--rate", "50", "--seconds", length, "-o", path}).status,
@@ -29,7 +29,7 @@ protected:
         return path;
     }
 
-    /// The most that the program has held while it decoded a recording, in KiB.
+    /// The greatest memory use while the program decoded a recording, in KiB.
     long peakOf(std::vector<std::string> options, const std::string& recording) const {
         options.insert(options.begin(), "decode");
         options.push_back(recording);
@@ -44,11 +44,11 @@ protected:
         return peak;
     }
 
-    /// Under the 24 MiB that a decoder may take, whatever the recording.
+    /// Below the limit of 24 MiB for a decoder, for any recording.
     static constexpr long kMost = 24L * 1024;
 
 private:
-    /// 0 when it has ended.
+    /// 0 after the process has ended.
     static long peakOf(pid_t process) {
         std::ifstream status("/proc/" + std::to_string(process) + "/status");
         std::string word;
@@ -61,7 +61,7 @@ private:
 };
 
 TEST_F(EndToEndMemory, DoesNotGrowWithTheRecordingHoweverItIsShown) {
-    const std::string recording = drive("3000"); // of 26 MB
+    const std::string recording = drive("3000"); // 26 MB
     EXPECT_LT(peakOf({"--every", "end"}, recording), kMost);
     EXPECT_LT(peakOf({"--every", "tick"}, recording), kMost);
     EXPECT_LT(peakOf({"--every", "tick", "--format", "csv"}, recording), kMost);

@@ -10,14 +10,14 @@ namespace {
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-/// The IFX technology, whose messages are objects: there is no log code in them.
+/// The IFX technology, whose messages are objects without log codes.
 class EndToEndObjectStream : public EndToEnd {
 protected:
     static constexpr int kIfxLinkType = 147;
 
     static ByteBuffer bytesOf(const std::string& text) { return {text.begin(), text.end()}; }
 
-    /// The picture of a cell in the text form, which a list with a header follows.
+    /// The picture of a cell in the text form, followed by a list with a header.
     static ByteBuffer picture(const std::string& arfcn, const std::string& state) {
         return bytesOf(doubles::textForm(
             Dictionary{{"Serving Cell",
@@ -29,7 +29,7 @@ protected:
         return *serializeBinary(Dictionary{{"Serving Cell", PropertyList::integer(12)}});
     }
 
-    /// A picture, a message with a number in it, one that is no property list, another picture.
+    /// A picture, a message with a number, one that is not a property list, and another picture.
     std::string badStream() const {
         return record("bad.pcap",
                       {{milliseconds(0), picture("12", "Idle")},

@@ -8,7 +8,7 @@ namespace {
 using doubles::eventually;
 using doubles::PallaxProcess;
 
-/// What the screen tells of where its values come from, and starting afresh.
+/// The origin of the values on the screen, and starting afresh.
 class EndToEndOrigin : public EndToEndScreen {
 protected:
     static std::vector<std::string> serviceOf(const std::string& technology) {
@@ -26,7 +26,7 @@ protected:
         EXPECT_EQ(terminal.wait(), 0);
         EXPECT_TRUE(terminal.isRestored());
     }
-    /// An LTE modem's values are on the screen; then the service speaks GSM.
+    /// Shows values of an LTE modem, then changes the service to GSM.
     void becomeGsm(PallaxTerminal& terminal) {
         PallaxProcess lte(world, serviceOf("lte"));
         ASSERT_TRUE(serviceIsThere());
@@ -63,16 +63,16 @@ TEST_F(EndToEndOrigin, AfterAReconnectOldValuesAreToldAndRStartsAfresh) {
     PallaxTerminal terminal(world, {}, {});
     becomeGsm(terminal);
     ASSERT_TRUE(terminal.shows("Zorell_GSM · live modem"));
-    EXPECT_TRUE(terminal.shows(" values from before 22:1")); // of the simulation's own time
+    EXPECT_TRUE(terminal.shows(" values from before 22:1")); // a time of the simulation
     EXPECT_TRUE(terminal.shows(": press R to start afresh "));
     EXPECT_TRUE(terminal.shows("Neighbor Cells List")) << "the display keeps its last values";
     terminal.resize(40, 20);
     EXPECT_TRUE(terminal.shows(": R renews"));
-    terminal.type("/list\r\r"); // R is pressed deep in the tree
+    terminal.type("/list\r\r"); // R is pressed in a deep pane
     ASSERT_TRUE(terminal.shows("Pallax › Neighbor Cells List\n"));
     terminal.resize(80, 24);
     terminal.type("R");
-    EXPECT_TRUE(terminal.shows("Equivalent PLMN List")); // the first pane's filter is still there
+    EXPECT_TRUE(terminal.shows("Equivalent PLMN List")); // the first pane keeps its filter
     terminal.type(kEscape);
     EXPECT_TRUE(terminal.shows("Serving PLMN"));
     EXPECT_TRUE(terminal.showsNoMore("values from before"));
@@ -88,7 +88,7 @@ TEST_F(EndToEndOrigin, WhereTheSettingSaysSoItStartsAfreshByItself) {
         << "after-reconnect = fresh\n";
     PallaxTerminal terminal(world, {}, {});
     becomeGsm(terminal);
-    terminal.type("s"); // also with the snapshot screen open
+    terminal.type("s"); // works with the snapshot screen open
     ASSERT_TRUE(terminal.shows("Save snapshot"));
     EXPECT_TRUE(terminal.shows("Zorell_GSM · live modem"));
     terminal.type("of LTE\r\r");

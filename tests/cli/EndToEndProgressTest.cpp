@@ -12,10 +12,10 @@ namespace {
 using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 
-/// A run that takes its time, for what it reads comes slowly.
+/// Runs that take long because their input comes slowly.
 class EndToEndProgress : public EndToEndScreen {
 protected:
-    /// The sample, for so many pipes at once, byte by byte over about three seconds.
+    /// Writes the sample into these pipes, byte by byte, over about three seconds.
     class SlowModem {
     public:
         SlowModem(std::string sample, std::vector<std::string> pipes)
@@ -69,14 +69,14 @@ TEST_F(EndToEndProgress, OnATerminalItAppearsAndIsWiped) {
     EXPECT_EQ(both.wait(), 0);
     EXPECT_EQ(noTerminal.wait(), 0);
 
-    EXPECT_EQ(alone.bytes().find('\n'), std::string::npos) << "one line, in place";
+    EXPECT_EQ(alone.bytes().find('\n'), std::string::npos) << "one line, rewritten";
     EXPECT_GT(std::count(alone.bytes().begin(), alone.bytes().end(), '\r'), 3);
     EXPECT_TRUE(alone.bytes().ends_with(" \r"));
     const std::string screen = alone.screen().text();
     EXPECT_EQ(screen.find_first_not_of('\n'), std::string::npos) << screen;
     EXPECT_TRUE(contentOf(nothing).starts_with("{\""));
 
-    EXPECT_EQ(both.screen().text().find(" packets"), std::string::npos) << "wiped for the data";
+    EXPECT_EQ(both.screen().text().find(" packets"), std::string::npos) << "then cleared";
     EXPECT_NE(both.bytes().find("\r{\"tick\":1,"), std::string::npos);
     EXPECT_EQ(noTerminal.err(), "");
 }
@@ -85,7 +85,7 @@ TEST_F(EndToEndProgress, OfAFileIsTheShareOfItsBytes) {
     const std::string drive = world.path("drive.pcap");
     const std::string written = world.path("written");
     ASSERT_EQ(run({"simulate", "lte", "--seconds", "60", "-o", drive}).status, 0);
-    // A reader that takes the output slowly lets the file be read slowly.
+    // A slow reader of the output slows the reading of the file.
     const std::string slowly = "{ sleep 1; for each in $(seq 12); do head -c 300000; sleep 0.2; "
                                "done; cat; }";
     PallaxTerminal terminal(world,

@@ -17,18 +17,18 @@ using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 using std::chrono::steady_clock;
 
-/// Real processes over the 5 seconds that lie between two tries to connect.
+/// Real processes during the 5 seconds between two attempts to connect.
 class EndToEndReconnect : public EndToEnd {
 protected:
-    /// The retry delay, less what it may take to see the line from which it is measured; and with
-    /// what a busy machine may add.
+    /// The retry delay, less the time it may take to see the line from which it is measured, and
+    /// plus the delays of a busy machine.
     static constexpr milliseconds kLeastDelay{4700};
     static constexpr milliseconds kMostDelay{5900};
 
     static constexpr const char* kStarted = "<3>Starting the display update timer\n";
     static constexpr const char* kNoPorts = "<3>Could not create the ports necessary\n";
 
-    /// The arguments of a service that plays one registration state round and round.
+    /// The arguments of a service that plays one registration state in a loop.
     std::vector<std::string> serviceOf(const std::string& name, unsigned state) const {
         std::vector<Packet> packets;
         for (int count = 0; count < 100; ++count) {
@@ -37,7 +37,7 @@ protected:
         return {"service", "--play", record(name, packets), "--loop", "--speed", "10"};
     }
 
-    /// When the viewer's log has come to hold a line `count` times.
+    /// The time at which the viewer's log has the line `count` times.
     static steady_clock::time_point seen(const PallaxProcess& viewer, const std::string& line,
                                          int count = 1) {
         EXPECT_TRUE(eventually([&] { return occurrences(viewer.err(), line) >= count; }))
@@ -59,7 +59,7 @@ protected:
     }
 };
 
-/// The lines of a log from the first that contains `text`, addresses replaced.
+/// The lines of a log from the first with `text` on, without addresses.
 std::vector<std::string> linesFrom(const std::string& log, const std::string& text) {
     std::vector<std::string> lines;
     std::istringstream stream(log);
@@ -71,7 +71,7 @@ std::vector<std::string> linesFrom(const std::string& log, const std::string& te
     return lines;
 }
 
-/// The time of the last block that is printed.
+/// The time of the last printed block.
 std::string lastTick(const std::string& printed) {
     const std::size_t at = printed.rfind("== ") + 3;
     return printed.substr(at, printed.find('\n', at) - at);
@@ -91,7 +91,7 @@ TEST_F(EndToEndReconnect, AfterAKilledServiceTheViewerTriesAgain5SecondsLaterAnd
     PallaxProcess again(world, serviceOf("second.pcap", 0));
     const auto started = seen(viewer, kStarted, 2);
     EXPECT_GE(started - failed, kLeastDelay);
-    EXPECT_LE(started - failed, kMostDelay) << "in view again 5 s after the service's return";
+    EXPECT_LE(started - failed, kMostDelay) << "it reconnects 5 s after the service's return";
     EXPECT_EQ(linesFrom(viewer.err(), "INVALIDATED"),
               (std::vector<std::string>{
                   "<3> ***** INVALIDATED 0xADDRESS *****", "<3>Could not create HXServerConnection",
@@ -105,7 +105,7 @@ TEST_F(EndToEndReconnect, AfterAKilledServiceTheViewerTriesAgain5SecondsLaterAnd
                       " stay on display (after-reconnect = fresh in pallax.conf starts afresh).",
                   "<3>Starting the display update timer"}));
 
-    // In between nothing is shown; then the display, which has kept the values of the first.
+    // First nothing is shown, then the display with the values of the first service.
     EXPECT_TRUE(eventually([&] {
         return occurrences(viewer.out(), "\nSIM Info\n") > occurrences(before, "\nSIM Info\n");
     }));
@@ -134,7 +134,7 @@ TEST_F(EndToEndReconnect, WhereTheSettingSaysSoTheDisplayStartsAfreshAfterARecon
     EXPECT_TRUE(viewer.says("  MM Service State: REG_STATE_INACTIVE\n"));
     EXPECT_EQ(viewer.err(), "pallax: No telephony service is running; waiting.\n"
                             "pallax: The link was restarted: the display starts afresh.\n");
-    EXPECT_EQ(viewer.out().find('*'), std::string::npos) << "its first block is a first one";
+    EXPECT_EQ(viewer.out().find('*'), std::string::npos) << "its first block marks no changes";
     end(viewer);
     end(again);
 }

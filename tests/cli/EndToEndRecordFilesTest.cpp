@@ -15,8 +15,7 @@ using doubles::contentOf;
 using doubles::eventually;
 using doubles::PallaxProcess;
 
-/// What becomes of files: those that `pallax record` and the system log write, and those that were
-/// there before.
+/// The files that `pallax record` and the system log write, and those that existed before.
 class EndToEndRecordFiles : public EndToEnd {
 protected:
     std::unique_ptr<PallaxProcess> serve(const std::string& modem) const {
@@ -37,7 +36,7 @@ protected:
         const int before = packetsIn(path);
         return eventually([&] { return packetsIn(path) > before + 10; });
     }
-    /// A recorder is under way; `meanwhile` happens to its file.
+    /// Calls `meanwhile` with the file of a running recorder.
     void endsOver(const std::string& name, const std::function<void(const std::string&)>& meanwhile,
                   const std::string& what) const {
         const std::string file = world.path(name);
@@ -90,7 +89,7 @@ TEST_F(EndToEndRecordFiles, ThatAreBeingWrittenTakeNoSecondRecorder) {
     const Run second = run({"record", "--overwrite", file});
     EXPECT_EQ(second.status, 1);
     EXPECT_EQ(second.err, "pallax: " + file + " is being read or written by another program.\n");
-    EXPECT_TRUE(grows(file)) << "the first is none the worse";
+    EXPECT_TRUE(grows(file)) << "the first is unaffected";
     recorder.signal(SIGINT);
     EXPECT_EQ(recorder.wait(), 0);
     EXPECT_EQ(recorder.err(), "");
@@ -134,7 +133,7 @@ TEST_F(EndToEndRecordFiles, ThatAreRemovedWhileNothingComesAreToldAtTheEnd) {
     service.signal(SIGSTOP);
     const int before = packetsIn(file);
     EXPECT_TRUE(eventually([&, last = before]() mutable {
-        return std::exchange(last, packetsIn(file)) == last; // what was under way has come
+        return std::exchange(last, packetsIn(file)) == last; // the last packets have arrived
     }));
     fs::remove(file);
     recorder.signal(SIGINT);

@@ -18,10 +18,10 @@ using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-/// `pallax record` against a service.
+/// `pallax record` with a service.
 class EndToEndRecord : public EndToEnd {
 protected:
-    /// Registrations, ten a second.
+    /// Ten registrations a second.
     std::string registrations(const std::string& name, int count) const {
         std::vector<Packet> packets;
         for (int index = 0; index < count; ++index) {
@@ -60,7 +60,7 @@ TEST_F(EndToEndRecord, WhatIsRecordedDecodesLikeTheRecordingThatWasPlayed) {
     const Run recorded = run({"record", file});
     EXPECT_EQ(recorded.status, 0);
     EXPECT_EQ(recorded.out, "");
-    EXPECT_EQ(recorded.err, "") << "no terminal, no progress";
+    EXPECT_EQ(recorded.err, "") << "no progress without a terminal";
     const std::string ticks = ticksOf(played);
     EXPECT_GT(ticks.size(), 1000U);
     EXPECT_EQ(ticksOf(file), ticks);
@@ -168,7 +168,7 @@ TEST_F(EndToEndRecord, AFullDiskEndsItWithASentenceAndTheFileUpToThereIsWhole) {
     rlimit before{};
     ::getrlimit(RLIMIT_FSIZE, &before);
     const rlimit small{4096, before.rlim_max};
-    // The counters of a build with coverage would meet the limit too.
+    // A build with coverage would also reach the limit with its profile.
     world.environment.emplace_back("LLVM_PROFILE_FILE=/dev/null");
     const std::string file = world.path("a.pcapng");
     ::setrlimit(RLIMIT_FSIZE, &small);
@@ -204,7 +204,7 @@ TEST_F(EndToEndRecord, OnATerminalItTellsHowFarItHasCome) {
     EXPECT_TRUE(recording.shows(" packets/s"));
     recording.signal(SIGINT);
     EXPECT_EQ(recording.wait(), 0);
-    EXPECT_TRUE(recording.bytes().ends_with("\r\n")) << "the shell's prompt has a line of its own";
+    EXPECT_TRUE(recording.bytes().ends_with("\r\n")) << "the shell's prompt is on its own line";
     end(service);
 }
 
@@ -223,7 +223,7 @@ TEST_F(EndToEndRecord, AfterAKilledServiceItGoesOnInTheSameFile) {
     EXPECT_TRUE(eventually([&] { return packetsIn(file) > before + 10; }));
     end(recorder);
     end(*service);
-    // The source began again with its first packet, and so do the stamps of the file.
+    // The source restarted with its first packet, and so did the stamps in the file.
     const Run decoded = run({"decode", "--every", "packet", file});
     std::vector<std::string> times;
     for (const auto& match : doubles::matchesIn(decoded.out, "\"time\":\"([^\"]*)\"")) {

@@ -19,12 +19,12 @@ using doubles::World;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-/// `pallax service --relay -`, fed through a named pipe by the test, the recording program.
+/// `pallax service --relay -`, which the test feeds through a named pipe like a recording program.
 class EndToEndRelay : public EndToEnd {
 protected:
     EndToEndRelay() {
         EXPECT_EQ(::mkfifo(pipe.c_str(), 0600), 0);
-        const Descriptor both(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // so that nobody waits
+        const Descriptor both(::open(pipe.c_str(), O_RDWR | O_CLOEXEC)); // does not wait
         service.emplace(world, std::vector<std::string>{"service", "--relay", "-"}, pipe);
         auto writer = RecordingWriter::create(pipe, kGsmLinkType);
         EXPECT_TRUE(writer);
@@ -38,7 +38,7 @@ protected:
     void sendBytes(const std::string& bytes) const {
         std::ofstream(pipe, std::ios::binary) << bytes;
     }
-    /// Waits until so many clients have started their stream.
+    /// Waits until this many clients have started their stream.
     bool clientsStream(int count) const {
         return eventually([&] {
             const std::string status = run({"service", "--status"}).out;
@@ -130,7 +130,7 @@ TEST_F(EndToEndRelay, WhoComesLaterGetsWhatComesLater) {
 }
 
 TEST_F(EndToEndRelay, AClientThatTakesNothingKeepsNobodyWaitingNotEvenTheEnd) {
-    constexpr int kPackets = 40'000; // of 50 bytes and more on the wire: above what may wait
+    constexpr int kPackets = 40'000; // each takes 50 bytes or more on the wire: more than may wait
     const std::string file = world.path("living.pcapng");
     PallaxProcess stopped(world, {"record", world.path("stopped.pcapng")});
     PallaxProcess living(world, {"record", file});
@@ -153,7 +153,7 @@ TEST_F(EndToEndRelay, AClientThatTakesNothingKeepsNobodyWaitingNotEvenTheEnd) {
 }
 
 TEST_F(EndToEndRelay, AClientThatComesLateToTheEndStillHearsEverything) {
-    constexpr int kPackets = 1000; // all of which the socket holds
+    constexpr int kPackets = 1000; // the socket has room for all
     const std::string file = world.path("a.pcapng");
     PallaxProcess recorder(world, {"record", file});
     ASSERT_TRUE(clientsStream(1));
@@ -197,7 +197,7 @@ TEST_F(EndToEndRelay, AStreamThatBreaksOffInAPacketIsAFailure) {
     EXPECT_EQ(service->wait(), 1);
     EXPECT_EQ(service->err(), "pallax: standard input ends in the middle of a packet. 1 packets "
                               "were relayed.\n");
-    EXPECT_EQ(recorder.wait(), 0) << "its channel was closed in order";
+    EXPECT_EQ(recorder.wait(), 0) << "its channel was closed normally";
     EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
 }
 
@@ -206,7 +206,7 @@ TEST_F(EndToEndRelay, AStreamThatTurnsToGarbageIsAFailure) {
     ASSERT_TRUE(clientsStream(1));
     send(seconds(0), 0);
     sendBytes(std::string(4096, '\xEE'));
-    EXPECT_EQ(service->wait(), 1) << "without the writer's end";
+    EXPECT_EQ(service->wait(), 1) << "before the writer's end";
     const std::string complaint = service->err();
     EXPECT_TRUE(complaint.starts_with("pallax: standard input cannot be read further: "))
         << complaint;
@@ -215,7 +215,7 @@ TEST_F(EndToEndRelay, AStreamThatTurnsToGarbageIsAFailure) {
     EXPECT_EQ(packetsIn(world.path("a.pcapng")), 1);
 }
 
-/// A stream that the test begins when it likes.
+/// A stream that begins when the test starts it.
 class EndToEndRelayBegins : public EndToEnd {
 protected:
     EndToEndRelayBegins() {
@@ -232,10 +232,10 @@ protected:
 
 TEST_F(EndToEndRelayBegins, AStreamWhoseHeaderDoesNotComeHasStalledAndMayGoOn) {
     const auto says = [this](const char* text) {
-        return service->says(text) || service->says(text); // twice as long, for a stall takes 10 s
+        return service->says(text) || service->says(text); // twice, because a stall takes 10 s
     };
     EXPECT_TRUE(says("pallax: The stream has stalled: no header for 10 s.\n"));
-    EXPECT_TRUE(world.sockets().empty()) << "nobody knows the technology yet";
+    EXPECT_TRUE(world.sockets().empty()) << "the technology is not known yet";
     auto writer = RecordingWriter::create(pipe, kGsmLinkType);
     ASSERT_TRUE(writer);
     auto device = std::move(writer).value();

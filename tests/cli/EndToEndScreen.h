@@ -31,7 +31,7 @@ protected:
             << "\nsave-button-marker = " << world.path("config") << "\n";
     }
 
-    /// Both states of the registration in turn, for a minute.
+    /// The two registration states in turn, for a minute.
     std::string changing() const {
         std::vector<Packet> packets;
         for (int count = 0; count < 60; ++count) {
@@ -41,7 +41,7 @@ protected:
         return record("changing.pcap", packets);
     }
 
-    /// Two packets, which are soon over.
+    /// Two packets, a short recording.
     std::string brief() const {
         return record("brief.pcap", {{std::chrono::milliseconds(0), registration(0)},
                                      {std::chrono::milliseconds(100), registration(2)}});
@@ -59,7 +59,7 @@ protected:
         return files;
     }
 
-    /// What the application leaves at every exit.
+    /// Checks the preference that the application stores at every exit.
     void expectHomeScreenPreference() const {
         const std::string file = world.path("config/pallax/preferences/com.norvane.plinthe.plist");
         EXPECT_NE(contentOf(file).find("<key>PLShowGSMRSSI</key>\n\t<false/>"), std::string::npos)

@@ -22,7 +22,7 @@ TEST_F(EndToEndScreen, PanesOpenThreeLevelsDeepAndCloseAgain) {
     EXPECT_TRUE(terminal.showsNoMore("› 0"));
     terminal.type("\x7f");
     EXPECT_TRUE(terminal.showsNoMore("Pallax › "));
-    EXPECT_TRUE(terminal.shows("of 11")); // the filter of the first pane is still there
+    EXPECT_TRUE(terminal.shows("of 11")); // the first pane keeps its filter
     terminal.type(kEscape);
     EXPECT_TRUE(terminal.shows("PDP Context Info"));
     terminal.type("q");
@@ -54,7 +54,7 @@ TEST_F(EndToEndScreen, APaneWhoseSectionVanishesGoesBackToTheDeepestThatIsStillT
     ASSERT_TRUE(terminal.shows("Pallax › SIM › Files"));
     EXPECT_TRUE(terminal.showsNoMore("› Files"));
     EXPECT_TRUE(terminal.shows("Pallax › SIM"));
-    terminal.type(kEscape); // the filter of the pane that has come back
+    terminal.type(kEscape); // clears the filter of the pane that is shown again
     EXPECT_TRUE(terminal.shows("PIN"));
     terminal.type("qq");
     EXPECT_EQ(terminal.wait(), 0);
@@ -111,7 +111,7 @@ TEST_F(EndToEndScreen, ASavedSnapshotHoldsWhatWasOnTheScreen) {
     const DictionaryRef root = snapshot->dictionary();
     EXPECT_EQ(root->find("Description")->string(), "tunnel entrance, über");
     const ArrayRef data = root->find("Data")->array();
-    ASSERT_EQ(data->size(), 2U); // one rebuild, and the DLF
+    ASSERT_EQ(data->size(), 2U); // one history entry and the DLF log
     const DictionaryRef display = (*data)[0].dictionary()->find("Display")->dictionary();
     EXPECT_EQ(display->find("Process CO")->dictionary()->find("MM Service State")->string(),
               "REG_STATE_REGISTERING");

@@ -8,7 +8,7 @@
 #include <set>
 #include <sstream>
 
-// A service that simulates a modem for viewers and recorders alike.
+// A service that simulates a modem for viewers and recorders.
 
 namespace pallax {
 namespace {
@@ -16,7 +16,7 @@ namespace {
 using doubles::eventually;
 using doubles::PallaxProcess;
 
-/// The end of the 20 simulated seconds that each of them is given.
+/// The end of the 20 simulated seconds that each client receives.
 constexpr const char* kLastTick = "== 2023-11-14 22:13:40 +0000\n";
 
 class EndToEndSimulatedService : public EndToEnd {
@@ -28,11 +28,11 @@ protected:
     bool serviceIsThere() const {
         return eventually([this] { return !world.sockets().empty(); });
     }
-    /// All that a viewer has printed until after the last tick.
+    /// The viewer's output until after the last tick.
     std::string shownBy(PallaxProcess& viewer) {
         EXPECT_TRUE(viewer.says(kLastTick));
         std::string shown;
-        EXPECT_TRUE(eventually([&] { // the rest of the tick may be on its way
+        EXPECT_TRUE(eventually([&] { // the end of the tick may follow later
             const bool isWhole = shown == viewer.out();
             shown = viewer.out();
             return isWhole;
@@ -44,7 +44,7 @@ protected:
         process.signal(SIGTERM);
         EXPECT_EQ(process.wait(), 0) << process.err();
     }
-    /// A recording's ticks as the viewer prints them.
+    /// A recording's ticks in the viewer's format.
     std::string printed(const std::string& recording) {
         const Run played = run({recording, "--print", "--speed", "max"});
         EXPECT_EQ(played.status, 0) << played.err;
@@ -53,7 +53,7 @@ protected:
     }
 };
 
-/// The sockets that a process has open, by the kernel's numbers.
+/// The inode numbers of a process's open sockets.
 std::vector<std::string> socketsOf(pid_t process) {
     std::vector<std::string> numbers;
     const std::string folder = "/proc/" + std::to_string(process) + "/fd";
@@ -106,7 +106,7 @@ TEST_F(EndToEndSimulatedService, NobodyOpensASocketOfTheNetwork) {
     EXPECT_TRUE(viewer.says("== "));
     EXPECT_TRUE(eventually([this] { return std::filesystem::exists(world.path("a.pcapng")); }));
     for (const PallaxProcess* each : {&modem, &viewer, &recorder}) {
-        // Its seventh column is the number of the socket.
+        // The seventh column is the socket's number.
         std::ifstream table("/proc/" + std::to_string(each->id()) + "/net/unix");
         std::set<std::string> local;
         for (std::string line; std::getline(table, line);) {
@@ -118,7 +118,7 @@ TEST_F(EndToEndSimulatedService, NobodyOpensASocketOfTheNetwork) {
             local.insert(column);
         }
         const auto open = socketsOf(each->id());
-        EXPECT_GE(open.size(), 2U) << "one that listens, one to the other side";
+        EXPECT_GE(open.size(), 2U) << "one listens, one is connected";
         for (const std::string& number : open) {
             EXPECT_TRUE(local.contains(number)) << "socket " << number;
         }

@@ -8,7 +8,7 @@
 #include <set>
 #include <sstream>
 
-// A simulated modem through the real program, and the service in its child process.
+// A simulated modem with the real program and the service in its child process.
 
 namespace pallax {
 namespace {
@@ -34,7 +34,7 @@ TEST_F(EndToEndSimulation, ADemoOfEachTechnologyPrintsTheTicksOfItsMinuteAndEnds
     }
 }
 
-/// The sections of a printed display, and whether each had something in it at any tick.
+/// The sections of a printed display, and whether each had content at any tick.
 std::map<std::string, bool> sectionsIn(const std::string& printed) {
     std::map<std::string, bool> filled;
     std::istringstream lines(printed);
@@ -44,7 +44,7 @@ std::map<std::string, bool> sectionsIn(const std::string& printed) {
         if (isInside) {
             filled[section] = true;
         } else if (!line.starts_with("== ") && !line.starts_with("Deallocing ")) {
-            const auto value = line.find(": "); // a section may be a value itself
+            const auto value = line.find(": "); // a section may itself be a value
             section = line.substr(0, value);
             filled[section] = filled[section] || value != std::string::npos;
         }

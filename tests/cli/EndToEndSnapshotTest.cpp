@@ -16,8 +16,7 @@ using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-/// Snapshots that are saved one after the other, of live streams, and of texts that XML cannot
-/// hold.
+/// Snapshots in a row, of live streams, and of texts that XML cannot represent.
 class EndToEndSnapshot : public EndToEndScreen {
 protected:
     /// Saves what is on the screen.
@@ -26,7 +25,7 @@ protected:
         ASSERT_TRUE(terminal.shows("Save snapshot"));
         terminal.type("\r\r");
         ASSERT_TRUE(terminal.shows("Saved " + snapshots));
-        terminal.type("j"); // the message goes
+        terminal.type("j"); // removes the message
         ASSERT_TRUE(terminal.showsNoMore("Saved "));
     }
     void quit(PallaxTerminal& terminal) const {

@@ -18,7 +18,7 @@ using doubles::PallaxProcess;
 using doubles::waitsForItsReader;
 using doubles::waitsForItsReaderNow;
 
-/// Programs whose output nobody takes: a pipe that is full, a terminal that Ctrl-S has stopped.
+/// Programs with blocked output: a full pipe, or a terminal stopped with Ctrl-S.
 class EndToEndStalledOutput : public EndToEndScreen {
 protected:
     EndToEndStalledOutput() {
@@ -28,7 +28,7 @@ protected:
         EXPECT_GT(::fcntl(reader.number(), F_SETPIPE_SZ, kSmall), 0);
     }
 
-    /// The status of a program that gets the signal while it waits for its reader.
+    /// The status of a program that gets the signal while it is blocked.
     int statusAfter(int number, const std::vector<std::string>& arguments) const {
         SCOPED_TRACE(testing::PrintToString(arguments));
         PallaxProcess process(world, arguments, "/dev/null", pipe);
@@ -39,7 +39,7 @@ protected:
         return status;
     }
 
-    /// What is in the pipe, which is empty then.
+    /// Empties the pipe and returns its content.
     std::string taken() const {
         std::string bytes;
         std::array<char, 4096> piece{};
@@ -132,12 +132,12 @@ TEST_F(EndToEndStalledOutput, OfAScreenThatIsStoppedEndsWithTheSignalAndIsRestor
 TEST_F(EndToEndStalledOutput, OfATerminalThatNobodyReadsEndsWithTheSignal) {
     PallaxTerminal terminal(world, {"demo", "gsm", "--speed", "20"}, {});
     ASSERT_TRUE(terminal.shows("Updated "));
-    EXPECT_TRUE(eventually([&] { // the screen goes on changing, and is painted anew
+    EXPECT_TRUE(eventually([&] { // the screen keeps changing and is redrawn
         terminal.type("\x0c");
         return waitsForItsReaderNow(terminal.id());
     }));
     terminal.signal(SIGTERM);
-    EXPECT_TRUE(doubles::hasEnded(terminal.id())) << "with nothing read";
+    EXPECT_TRUE(doubles::hasEnded(terminal.id())) << "its output was not read";
     EXPECT_EQ(terminal.wait(), 0);
     expectHomeScreenPreference();
     expectNothingLeft();

@@ -14,7 +14,7 @@ using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-/// A command line, how it ends, and all that it says on standard error.
+/// A command line, its exit status, and its whole standard error.
 struct Case {
     std::vector<std::string> arguments;
     int status;
@@ -24,7 +24,7 @@ struct Case {
     std::vector<std::string> environment{};
 };
 
-/// Every command with every exit status that its help names.
+/// Checks every command with every exit status in its help.
 class EndToEndStatus : public EndToEnd {
 protected:
     EndToEndStatus() {
@@ -44,7 +44,7 @@ protected:
         _seen.emplace(isCommand ? first : "pallax", std::to_string(expected.status));
     }
 
-    /// Fails for a status that a command's help names and no case has had, or the other way round.
+    /// Compares the exit statuses in the commands' help with those of the cases.
     void expectEveryDocumentedStatus(const std::set<std::string>& commands) const {
         std::set<std::pair<std::string, std::string>> documented;
         const CommandDescription program = CommandLine().description();

@@ -19,7 +19,7 @@ using std::chrono::milliseconds;
 
 constexpr const char* kLastState = "  MM Service State: REG_STATE_REGISTERING\n";
 
-/// Recordings that come through a pipe with a name.
+/// Recordings that come through a named pipe.
 class EndToEndStream : public EndToEndScreen {
 protected:
     EndToEndStream() { EXPECT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0); }
@@ -29,7 +29,7 @@ protected:
         }
     }
 
-    /// Writes a recording into the pipe once somebody reads there, as `cat` does.
+    /// Writes a recording into the pipe when it has a reader, as `cat` does.
     void feed(const std::string& recording) {
         _writer = std::thread([this, bytes = contentOf(recording)] {
             const Descriptor writer(::open(pipe.c_str(), O_WRONLY | O_CLOEXEC));
@@ -38,7 +38,7 @@ protected:
         });
     }
 
-    /// The program's command line for a shell that is not in its world.
+    /// The program's command line for a shell outside its world.
     std::string shellCommand(const std::string& arguments) const {
         std::string command = "env";
         for (const std::string& setting : doubles::programEnvironment(world)) {

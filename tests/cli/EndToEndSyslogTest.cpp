@@ -16,7 +16,7 @@
 namespace pallax {
 namespace {
 
-/// The real system log: the program runs where /dev/log is a socket of the test's.
+/// The real system log: the program sees a socket of the test as /dev/log.
 class EndToEndSyslog : public EndToEndScreen {
 protected:
     EndToEndSyslog() {
@@ -38,7 +38,7 @@ protected:
         }
     }
 
-    /// Runs a command that sees a /dev of its own; nobody else does.
+    /// Runs a command with its own /dev.
     doubles::CommandRun runWithLog(const std::string& command) const {
         const std::string dev = world.path("dev");
         const std::string script = world.path("script");
@@ -52,7 +52,7 @@ protected:
         return doubles::runCommand("unshare --user --map-root-user --mount sh " + script);
     }
 
-    /// The lines that the program sends to the system log meanwhile, each "<priority>text".
+    /// The lines that the program sends to the system log, each "<priority>text".
     std::vector<std::string> linesOf(const std::string& arguments) const {
         std::string command = "env";
         for (const std::string& setting : doubles::programEnvironment(world)) {
@@ -78,7 +78,8 @@ protected:
     }
 
 private:
-    /// Until the program has ended and nothing is left; it waits where nobody receives.
+    /// Receives until the program has ended and nothing is left; the program blocks without a
+    /// receiver.
     void receive(std::vector<std::string>& lines, const std::atomic<bool>& isOver) const {
         constexpr int kLook = 20; // milliseconds
         std::array<char, 65536> message{};
@@ -94,7 +95,7 @@ private:
         }
     }
 
-    /// Without the time, the process number and addresses.
+    /// The message without time, process number and addresses.
     static std::string shortened(const std::string& message) {
         const auto* const head =
             R"(^(<[0-9]+>)[A-Z][a-z]{2} [ 0-9]{2} [0-9:]{8} pallax\[[0-9]+\]: )";

@@ -10,7 +10,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-/// Every command that shows something, with templates of its own.
+/// Runs all commands that show something, with the test's templates.
 class EndToEndTemplate : public EndToEnd {
 protected:
     EndToEndTemplate() {
@@ -52,7 +52,7 @@ TEST_F(EndToEndTemplate, ThatIsMissingIsOneSentenceAndFailure) {
     isRefusedEverywhere(sample("utran-drive.pcap"),
                         "pallax: There is no display template for UTRAN in " + templates + ".\n");
     isRefused({"demo", "lte", "--print"}, unloadable("LTE.plist", "No such file or directory"));
-    EXPECT_EQ(run({"decode", sample("gsm-attach.pcap")}).status, 0) << "it has its own";
+    EXPECT_EQ(run({"decode", sample("gsm-attach.pcap")}).status, 0) << "not affected";
 }
 
 TEST_F(EndToEndTemplate, ThatIsCutIsOneSentenceAndFailure) {

@@ -13,7 +13,7 @@ namespace {
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
-/// What a terminal may expect of a program.
+/// The terminal behaviour that users expect of a program.
 class EndToEndTerminal : public EndToEndScreen {};
 
 TEST_F(EndToEndTerminal, ResizingIsSafeAtAnyMoment) {
@@ -36,11 +36,11 @@ TEST_F(EndToEndTerminal, ItIsSuspendedAndComesBack) {
     PallaxTerminal terminal(world, {"--norc", "--noprofile", "-i"}, {.program = "/bin/bash"});
     ASSERT_TRUE(terminal.shows("$"));
     terminal.type(doubles::programPath() + " " + changing() + " --speed 4\r");
-    ASSERT_TRUE(terminal.shows("Process CO")); // the rest may still be being drawn
+    ASSERT_TRUE(terminal.shows("Process CO")); // the rest may follow later
     terminal.type("\x1a");
     ASSERT_TRUE(terminal.shows("Stopped"));
     EXPECT_FALSE(terminal.screen().isOnOtherScreen());
-    (void)terminal.settled(); // the shell drops what is typed before its prompt
+    (void)terminal.settled(); // the shell drops keys typed before its prompt
     terminal.type("fg\r");
     EXPECT_TRUE(terminal.showsNoMore("Stopped"));
     EXPECT_TRUE(terminal.shows("Process CO"));
@@ -163,8 +163,8 @@ TEST_F(EndToEndTerminal, KeysThatTheTerminalSendsDifferentlyFromItsTypeAreKnown)
     ASSERT_TRUE(terminal.shows("▌Process CO"));
     terminal.type("\r");
     ASSERT_TRUE(terminal.shows("Pallax › Process CO"));
-    terminal.type("\x1b[6~\x1b[1~\x1b[4~"); // a page down, Home, End: nothing goes back
-    terminal.type("\x1b[200~\x1b[I");       // a paste begins, the focus comes: no keys
+    terminal.type("\x1b[6~\x1b[1~\x1b[4~"); // page down, Home, End: none goes back
+    terminal.type("\x1b[200~\x1b[I");       // start of a paste and a focus event: not keys
     terminal.settled();
     EXPECT_TRUE(terminal.shows("Pallax › Process CO"));
     terminal.type(kEscape);
@@ -217,7 +217,7 @@ TEST_F(EndToEndTerminal, ATickClearsNothing) {
     const std::string since = terminal.bytes().substr(before);
     EXPECT_EQ(since.find("\x1b[2J"), std::string::npos);
     EXPECT_EQ(since.find("\x1b[H"), std::string::npos);
-    EXPECT_LT(since.size(), 2000U) << "only what has changed is drawn";
+    EXPECT_LT(since.size(), 2000U) << "only changes are drawn";
     terminal.type("qq");
     EXPECT_EQ(terminal.wait(), 0);
 }

@@ -17,7 +17,7 @@ using doubles::eventually;
 using doubles::PallaxProcess;
 using std::chrono::milliseconds;
 
-/// A service, viewers and recorders where a folder or a peer of the same user makes it hard.
+/// A service, viewers and recorders with a bad folder or an unfriendly peer of the same user.
 class EndToEndUnfriendlyPeer : public EndToEnd {
 protected:
     EndToEndUnfriendlyPeer() {
@@ -52,7 +52,7 @@ TEST_F(EndToEndUnfriendlyPeer, InAFolderWhosePathIsLongerThanASocketsEverythingW
     EXPECT_TRUE(eventually([this] {
         return run({"service", "--status"}).out.find("\nClients: 2\n") != std::string::npos;
     }));
-    EXPECT_EQ(run({recording, "--print", "--speed", "max"}).status, 0) << "a service of its own";
+    EXPECT_EQ(run({recording, "--print", "--speed", "max"}).status, 0) << "it has its own service";
     end(recorder);
     end(viewer);
     end(source);
@@ -63,7 +63,7 @@ TEST_F(EndToEndUnfriendlyPeer, InAFolderWhosePathIsLongerThanASocketsEverythingW
 TEST_F(EndToEndUnfriendlyPeer, APeerThatKeepsTheFoldersLockKeepsNobodyOut) {
     PallaxProcess killed(world, service);
     ASSERT_TRUE(eventually([this] { return !world.sockets().empty(); }));
-    killed.signal(SIGKILL); // its socket stays
+    killed.signal(SIGKILL); // its socket remains
     EXPECT_EQ(killed.wait(), -SIGKILL);
     const Descriptor folder(::open(world.path("pallax").c_str(), O_RDONLY | O_CLOEXEC));
     ASSERT_EQ(::flock(folder.number(), LOCK_EX), 0);

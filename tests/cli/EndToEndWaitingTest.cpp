@@ -13,7 +13,7 @@ using std::chrono::milliseconds;
 
 constexpr const char* kNoService = "No telephony service is running; waiting";
 
-/// What programs say that have no connection.
+/// The messages of programs without a connection.
 class EndToEndWaiting : public EndToEndScreen {
 protected:
     std::vector<std::string> service() const {
@@ -70,7 +70,7 @@ TEST_F(EndToEndWaiting, AViewerOnTheScreenSaysItInTheStatusUntilItIsConnected) {
     EXPECT_TRUE(terminal.showsNoMore(kNoService));
     source.signal(SIGKILL);
     EXPECT_EQ(source.wait(), -SIGKILL);
-    EXPECT_TRUE(terminal.shows(kNoService)) << "and again when the link is lost";
+    EXPECT_TRUE(terminal.shows(kNoService)) << "again after the link is lost";
     terminal.type("q");
     EXPECT_EQ(terminal.wait(), 0);
 }

@@ -28,10 +28,10 @@ constexpr milliseconds kTooLate{1300}; // a viewer waits for a second
 
 [[noreturn]] void die() {
     (void)::raise(SIGKILL);
-    std::abort(); // it is not reached
+    std::abort(); // not reached
 }
 
-/// The process's whole content.
+/// The content of the process.
 class Service {
 public:
     Service(Fault fault, int ready) : _fault(fault), _ready(ready) {}
@@ -65,7 +65,7 @@ private:
             die();
         }
     }
-    /// The answer goes out before the next block.
+    /// The answer is sent before the next block runs.
     void dieNextIf(Fault fault) {
         if (happens(fault)) {
             _queue.async([] { die(); });
@@ -151,7 +151,7 @@ private:
     bool _isLive = _fault == Fault::ChannelClosedWhileLive;
 };
 
-/// What the test has open is none of the service's.
+/// Closes the test's other descriptors.
 void closeAllBut(int descriptor) {
     constexpr int kFirst = STDERR_FILENO + 1;
     const long most = ::sysconf(_SC_OPEN_MAX);

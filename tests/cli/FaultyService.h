@@ -5,7 +5,7 @@
 
 namespace pallax::doubles {
 
-/// What goes wrong with a service, once; after that it serves as it should, if it lives.
+/// The service's only fault; afterwards it works, unless the fault ends it.
 enum class Fault {
     None,
     KilledBeforeTheConnection,
@@ -15,26 +15,26 @@ enum class Fault {
     KilledAfterTheReply,
     KilledAtTheStartCommand,
     KilledWhileStreaming,
-    ChannelClosedWhileLive, ///< streams on, live, and its stamps stand
+    ChannelClosedWhileLive, ///< keeps streaming live, with stamps that do not advance
     ReplyTooLate,
     ReplyIsNoPropertyList,
     ReplyWithoutTheKey,
     UnknownTechnology,
 };
 
-/// A telephony service of the GSM technology in a process of its own, which does what no real
-/// one should. It streams a registration record with each of its seconds, as fast as it is taken.
-/// $XDG_RUNTIME_DIR is the sockets' folder.
+/// A telephony service of the GSM technology in its own process, with a fault that no real service
+/// should have. It streams a registration record for each second, as fast as it is read. The socket
+/// folder is $XDG_RUNTIME_DIR.
 class FaultyService {
 public:
-    /// Returns once clients can connect, or, where that is the fault, once it has been killed.
+    /// Returns when clients can connect or, for that fault, when the service was killed.
     explicit FaultyService(Fault fault);
     /// Kills it.
     ~FaultyService();
     FaultyService(const FaultyService&) = delete;
     FaultyService& operator=(const FaultyService&) = delete;
 
-    /// True once it has ended by itself.
+    /// True after it has ended by itself.
     bool hasEnded();
 
 private:

@@ -80,7 +80,7 @@ TEST(Options, DecodeWritesTheLastDisplayAsJsonUnlessToldOtherwise) {
     EXPECT_FALSE(plain.strict);
 
     const auto csv = parsed<DecodeOptions>({"decode", "--format", "csv", "a.pcap"});
-    EXPECT_EQ(csv.chosenEvery(), Every::Tick) << "CSV tells what changes";
+    EXPECT_EQ(csv.chosenEvery(), Every::Tick) << "CSV shows changes";
 
     const auto told =
         parsed<DecodeOptions>({"decode", "--technology", "lte", "--every", "tick", "--format",
@@ -343,7 +343,7 @@ TEST(Options, AMistypedCommandOrChoiceIsAnsweredWithTheNearest) {
     EXPECT_EQ(wrongUsage({"decode", "--every", "tcik", "a"}),
               "pallax: --every: \"tcik\" is not one of end|tick|packet. Did you mean \"tick\"? "
               "(see pallax decode --help)\n");
-    EXPECT_EQ(recordingPath(parsed<BrowseOptions>({"drive"}).source), "drive") << "near to nothing";
+    EXPECT_EQ(recordingPath(parsed<BrowseOptions>({"drive"}).source), "drive") << "no similar word";
 }
 
 TEST(Options, ARecordingNamedNearlyLikeACommandIsBrowsed) {

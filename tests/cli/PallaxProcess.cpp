@@ -24,7 +24,7 @@ using std::chrono::seconds;
 
 constexpr milliseconds kLook{5};
 
-/// What stands in for the program (a memory checker) may take so many times as long.
+/// Programs run by another program (a memory checker) may take this many times as long.
 constexpr int kSlowness = 10;
 
 const char* standIn() {
@@ -76,7 +76,7 @@ std::string programPath() {
 }
 
 std::vector<std::string> programEnvironment(const World& world) {
-    std::vector<std::string> environment = world.environment; // of two, the first is seen
+    std::vector<std::string> environment = world.environment; // the first of two assignments counts
     environment.insert(environment.end(), {"XDG_RUNTIME_DIR=" + world.path(),
                                            "XDG_CONFIG_HOME=" + world.path("config"), "TZ=UTC"});
     return environment;
@@ -93,7 +93,7 @@ bool waitsForItsReader(pid_t process, int output) {
 bool waitsForItsReaderNow(pid_t process, int output) {
     std::ifstream call("/proc/" + std::to_string(process) + "/syscall");
     std::string text;
-    std::getline(call, text); // the number of the call that it waits in, and the arguments
+    std::getline(call, text); // the number of the blocking system call, and its arguments
     return text.starts_with(std::to_string(SYS_write) + " 0x" + std::to_string(output) + " ");
 }
 

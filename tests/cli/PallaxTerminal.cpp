@@ -69,7 +69,7 @@ void PallaxTerminal::signal(int number) const {
     (void)::kill(_process, number);
 }
 
-/// True when something came.
+/// True when bytes have arrived.
 bool PallaxTerminal::readFor(int milliseconds) {
     pollfd waiting{_terminal, POLLIN, 0};
     if (_isClosed || ::poll(&waiting, 1, milliseconds) <= 0) {
@@ -78,7 +78,7 @@ bool PallaxTerminal::readFor(int milliseconds) {
     std::array<char, 4096> buffer{};
     const ssize_t count = ::read(_terminal, buffer.data(), buffer.size());
     if (count <= 0) {
-        _isClosed = true; // the last process that had it has ended
+        _isClosed = true; // the last process that had it open has ended
         return false;
     }
     const std::string_view bytes(buffer.data(), static_cast<std::size_t>(count));

@@ -10,8 +10,8 @@
 
 namespace pallax::doubles {
 
-/// A program that runs in a pseudo-terminal of its own: keys go in, and what a user would see is
-/// read from an emulated screen.
+/// A program in its own pseudo-terminal: the test types keys and reads an emulated screen, as a
+/// user would.
 class PallaxTerminal {
 public:
     struct Setup {
@@ -19,7 +19,7 @@ public:
         int rows = 24;
         std::string type = "xterm-256color"; ///< TERM
         std::string locale = "C.UTF-8";
-        std::string program{}; ///< the real `pallax` when empty
+        std::string program{}; ///< empty: the real `pallax`
     };
 
     PallaxTerminal(const World& world, std::vector<std::string> arguments, const Setup& setup);
@@ -31,23 +31,23 @@ public:
     void type(const std::string& keys) const;
     void resize(int columns, int rows);
     void signal(int number) const;
-    /// While it runs.
+    /// Valid while it runs.
     pid_t id() const { return _process; }
 
-    /// True once the screen shows the text; false, with a test failure that shows the screen,
-    /// when it does not within ten seconds.
+    /// Waits until the screen shows the text. After ten seconds it returns false and fails the test
+    /// with the screen.
     bool shows(const std::string& text);
-    /// True once the screen no longer shows the text; as `shows` otherwise.
+    /// Waits until the screen no longer shows the text; otherwise like `shows`.
     bool showsNoMore(const std::string& text);
-    /// The screen as it is once nothing more has come for a moment.
+    /// The screen after a moment without output.
     std::string settled();
-    /// As PallaxProcess's; what is written until the end is read.
+    /// As PallaxProcess::wait; also reads the output until the end.
     int wait();
 
     const TerminalScreen& screen() const { return _screen; }
-    /// All bytes that came so far.
+    /// All bytes received so far.
     const std::string& bytes() const { return _bytes; }
-    /// Whether the terminal is as a shell leaves it: lines and echo, as at the start.
+    /// Whether lines and echo are on, as at the start.
     bool isRestored() const;
 
 private:

@@ -4,7 +4,7 @@ namespace pallax::doubles {
 
 namespace {
 
-/// Of a window's title, which the emulator does not keep.
+/// Saves and restores the window's title, which the emulator does not keep.
 constexpr char kTitleStack = 't';
 
 std::string& unknownOf(void* unknown) {

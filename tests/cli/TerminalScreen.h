@@ -7,7 +7,7 @@
 
 namespace pallax::doubles {
 
-/// What a terminal of type xterm shows after the bytes that were written to it.
+/// The screen of an xterm after the bytes that were written to it.
 class TerminalScreen {
 public:
     TerminalScreen(int columns, int rows);
@@ -15,7 +15,7 @@ public:
     TerminalScreen& operator=(const TerminalScreen&) = delete;
 
     void write(std::string_view bytes);
-    /// The rows without the blanks at their ends, each with its line end.
+    /// The rows without trailing blanks, each with a line end.
     std::string text() const;
     bool isOnOtherScreen() const { return _isOnOtherScreen; }
     /// The escape and control sequences that the terminal did not understand.
@@ -29,8 +29,8 @@ private:
     using Terminal = std::unique_ptr<VTerm, Free>;
 
     Terminal _terminal;
-    Terminal
-        _escapes; ///< a parser alone, for the terminal reports unknown escapes of one letter only
+    /// A separate parser, because the terminal reports only unknown escapes of one letter.
+    Terminal _escapes;
     VTermScreen* _screen;
     bool _isOnOtherScreen = false;
     std::string _unknown;

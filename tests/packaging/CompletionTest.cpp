@@ -25,7 +25,7 @@ protected:
         folder.write("other.pcap", "");
     }
 
-    /// What a real shell prints for `lines`, one word a line, in a folder with two recordings.
+    /// The output of a real shell for `lines`, one word a line, in a folder with two recordings.
     std::string offered(const char* shell, const std::string& lines) const {
         folder.write(".script", script(shell));
         folder.write(".ask", lines);
@@ -34,7 +34,7 @@ protected:
         return run.out;
     }
 
-    /// What bash offers for the last of the words, which are split as it does.
+    /// Bash's completions of the last word; the words are split as bash does.
     std::string inBash(const std::string& words, int current) const {
         return offered("bash", "set -u\nsource ./.script\nCOMP_WORDS=(" + words +
                                    ")\nCOMP_CWORD=" + std::to_string(current) +
@@ -67,7 +67,7 @@ TEST_F(Completion, BashOffersTheChoicesOfAnOption) {
     EXPECT_EQ(inBash("pallax --log-level ''", 2), "0\n1\n2\n3\n4\n5\n6\n7\n");
     EXPECT_EQ(inBash("pallax demo ''", 2), "ifx\ngsm\ncdma\nlte\nutran\n");
     EXPECT_EQ(inBash("pallax fields c", 2), "cdma\n");
-    EXPECT_EQ(inBash("pallax demo --seed ''", 3), "") << "a number is the user's";
+    EXPECT_EQ(inBash("pallax demo --seed ''", 3), "") << "numbers are not completed";
 }
 
 TEST_F(Completion, BashOffersFilesWhereARecordingOrFileIsTaken) {
@@ -130,7 +130,7 @@ TEST_F(Completion, ZshTakesTheScript) {
     if (!isInstalled("zsh")) {
         GTEST_SKIP() << "zsh is not installed";
     }
-    // The completion system's functions only tell what they are asked for.
+    // Stand-ins for the completion system's functions, which print their arguments.
     const std::string told =
         offered("zsh", "compdef() { print compdef $* }\n_arguments() { print -l -- \"$@\" }\n"
                        "source ./.script\nwords=(pallax simulate '')\nCURRENT=3\n_pallax\n");

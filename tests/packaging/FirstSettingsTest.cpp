@@ -15,7 +15,7 @@ using doubles::contentOf;
 /// The script that `run` calls before it opens the viewer.
 class FirstSettings : public testing::Test {
 protected:
-    /// Runs it with nothing in the environment but these assignments; its exit status.
+    /// Runs it with only these variables in the environment and returns its exit status.
     int run(const std::string& environment) const {
         const std::string command = "env -i PATH=/usr/bin:/bin " + environment + " " +
                                     PALLAX_SOURCE_DIR + "/scripts/first-settings 2>" +
@@ -71,7 +71,7 @@ TEST_F(FirstSettings, FollowTheFoldersOfTheEnvironment) {
 
 TEST_F(FirstSettings, AreNotWrittenToARelativeFolderNorWithoutAHome) {
     EXPECT_EQ(run(home() + " XDG_CONFIG_HOME=relative"), 0);
-    EXPECT_TRUE(std::filesystem::exists(file)) << "as the viewer reads them";
+    EXPECT_TRUE(std::filesystem::exists(file)) << "where the viewer reads them";
     EXPECT_EQ(run(""), 0);
 }
 

@@ -18,7 +18,7 @@ using doubles::contentOf;
 using doubles::isInstalled;
 using doubles::runCommand;
 
-/// An installation into a prefix that nobody else knows.
+/// An installation into a prefix of its own.
 class Installation : public testing::Test {
 protected:
     Installation() {
@@ -27,7 +27,7 @@ protected:
         EXPECT_EQ(run.status, 0) << run.out;
     }
 
-    /// The files of a folder of the installation, from there on.
+    /// The files below a folder of the installation, as paths from there.
     std::set<std::string> files(const std::string& folder) const {
         std::set<std::string> names;
         const fs::path root = prefix.path(folder);
@@ -49,7 +49,7 @@ TEST_F(Installation, TheInstalledProgramDecodesARecordingWithTheInstalledTemplat
     EXPECT_EQ(run.status, 0) << run.out;
     EXPECT_TRUE(run.out.starts_with("{\"")) << run.out;
 
-    // Its own templates are what it reads: without them, the folder is there but empty.
+    // It reads its own templates: without them, the folder exists but is empty.
     for (const std::string& name : files("share/pallax")) {
         fs::remove(prefix.path("share/pallax/" + name));
     }
@@ -91,7 +91,7 @@ TEST_F(Installation, WhatTheDocumentsLeadToIsThere) {
             ++links;
         }
     }
-    EXPECT_GE(links, 10U) << "the README, the tour and the tables of the records lead to others";
+    EXPECT_GE(links, 10U) << "the README, the tour and the tables of the records have links";
 }
 
 TEST_F(Installation, TheServiceUnitStartsTheInstalledProgram) {

@@ -19,7 +19,7 @@ using doubles::isInstalled;
 using doubles::replaced;
 using doubles::runCommand;
 
-/// The page's text without roff's marks.
+/// The page's text without roff markup.
 std::string plain(const std::string& page) {
     return replaced(replaced(page, R"(\\f[BIR])", ""), R"(\\-)", "-");
 }

@@ -9,8 +9,8 @@
 namespace pallax {
 namespace {
 
-/// The script with which `run` and `test` see that every package is there; what it asks of the
-/// system is answered by stand-ins.
+/// The script with which `run` and `test` check for missing packages. Stand-ins answer its
+/// questions to the system.
 class NeedPackages : public testing::Test {
 protected:
     NeedPackages() {
@@ -21,7 +21,7 @@ protected:
         std::ofstream(folder.path(name)) << "#!/bin/sh\n" << text << '\n';
         std::filesystem::permissions(folder.path(name), std::filesystem::perms::owner_all);
     }
-    /// Runs it as the user of that number.
+    /// Runs it as the user with that number.
     doubles::CommandRun run(const std::string& user, const std::string& packages) const {
         standIn("id", "echo " + user);
         return doubles::runCommand("PATH=" + folder.path() + ":$PATH " + PALLAX_SOURCE_DIR +

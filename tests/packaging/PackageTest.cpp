@@ -16,7 +16,7 @@ using doubles::isInstalled;
 using doubles::runCommand;
 using doubles::TemporaryFolder;
 
-/// The Debian package, which the test MakePackage has made.
+/// The Debian package that the test MakePackage makes.
 class Package : public testing::Test {
 protected:
     void SetUp() override {
@@ -28,7 +28,7 @@ protected:
 
     static std::string package() { return PALLAX_PACKAGE_FOLDER "/pallax_*.deb"; }
 
-    /// Everything in a folder but the package manager's own files, from there on.
+    /// Everything below a folder except the package manager's files, as paths from there.
     static std::set<std::string> content(const std::string& root) {
         std::set<std::string> names;
         for (auto entry = fs::recursive_directory_iterator(root);

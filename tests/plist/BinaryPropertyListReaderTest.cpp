@@ -253,7 +253,7 @@ TEST(BinaryPropertyListReader, RefusesSharedContainersThatDoubleAtEachOf40Levels
 }
 
 TEST(BinaryPropertyListReader, RefusesDataThatOverlapToFarMoreThanTheFile) {
-    // Data of 50000 bytes each, beginning every 4 bytes.
+    // Data of 50000 bytes each; each begins 4 bytes after the one before.
     constexpr std::uint8_t kCount = 250;
     std::vector<ByteBuffer> objects = {{0xAF, 0x10, kCount}};
     for (std::uint8_t number = 1; number <= kCount; ++number) {

@@ -9,7 +9,7 @@ std::string refusalOfWriting(const PropertyList& object) {
     return refusalOf(serializeBinary(object));
 }
 
-/// The bytes of the only object: what lies between the header and the table of one byte.
+/// The bytes of the only object, between the header and the table of one byte.
 ByteBuffer onlyObject(const PropertyList& object) {
     constexpr std::size_t kHeader = 8;
     constexpr std::size_t kTableAndTrailer = 33;
@@ -28,7 +28,7 @@ TEST(BinaryPropertyListWriter, WritesHeaderObjectsTableAndTrailer) {
         0x51, 'k',                                 // 1: written once
         0xA2, 0x01, 0x03,                          // 2: the array
         0x09,                                      // 3: true
-        8,    11,   13,   16,                      // where they are
+        8,    11,   13,   16,                      // their offsets
         0,    0,    0,    0,   0,   0,   1,   1,   // widths
         0,    0,    0,    0,   0,   0,   0,   4,   // objects
         0,    0,    0,    0,   0,   0,   0,   0,   // the root

@@ -1,4 +1,4 @@
-// What a dictionary keeps to be quick must never show.
+// The data that a dictionary keeps for speed must never be visible.
 
 #include "plist/PropertyList.h"
 #include "tests/doubles/InOrder.h"
@@ -16,7 +16,7 @@ namespace {
 
 using doubles::sameInOrder;
 
-/// What a dictionary does, done in the simplest way.
+/// A dictionary in its simplest form.
 class Model {
 public:
     void set(const std::string& key, const std::string& value) {
@@ -101,7 +101,7 @@ TEST(Dictionary, WhatWasMovedFromIsEmptyAndUsable) {
         const Dictionary to = std::move(from);
         EXPECT_EQ(to.size(), static_cast<std::size_t>(size));
         EXPECT_NE(to.find("2"), nullptr);
-        EXPECT_TRUE(from.empty()); // NOLINT(bugprone-use-after-move): what it is about
+        EXPECT_TRUE(from.empty()); // NOLINT(bugprone-use-after-move): tests this
         EXPECT_EQ(from.find("2"), nullptr);
         from.setFixed("2", "new");
         EXPECT_EQ(*from.find("2"), PropertyList("new"));

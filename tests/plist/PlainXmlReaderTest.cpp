@@ -22,7 +22,7 @@ std::string listOf(const std::string& value) {
     return kHead + value + kTail;
 }
 
-/// What the whole reader makes of a text; a comment keeps the plain one away.
+/// The whole reader's result for a text; a comment makes the plain reader refuse it.
 PropertyListResult wholeReading(const std::string& xml) {
     const std::string commented = xml + "<!-- -->";
     return parseXmlPropertyList(ByteBuffer(commented.begin(), commented.end()));
@@ -93,7 +93,7 @@ TEST(PlainXmlReader, ReadsContainersAsDeepAsTheWholeReaderDoes) {
     }
 }
 
-/// Any of the pieces of which plain texts, and texts that are almost plain, are made.
+/// A random piece of texts that are plain or almost plain.
 std::string randomXml() {
     static const std::vector<std::string> kPieces = {"<dict>",
                                                      "</dict>",

@@ -1,4 +1,4 @@
-// Files of another codec against their content, which lies beside them as tagged JSON.
+// Compares files of another codec with their content, which is beside them as tagged JSON.
 
 #include "tests/doubles/Files.h"
 #include "tests/plist/PropertyListSupport.h"
@@ -97,7 +97,7 @@ TEST_P(PropertyListFiles, HoldsItsContent) {
 TEST_P(PropertyListFiles, ACopyTruncatedAtAnyLengthIsRefused) {
     const ByteBuffer bytes = bytesOf(contentOf(path(".bplist")));
     for (std::size_t length = 0; length < bytes.size(); ++length) {
-        // A copy of its own, so that a sanitizer sees a read past the cut.
+        // A separate copy, so that a sanitizer detects a read past the cut.
         const ByteBuffer cut(bytes.begin(), bytes.begin() + static_cast<std::ptrdiff_t>(length));
         EXPECT_FALSE(parseBinaryPropertyList(cut)) << length << " bytes";
     }
@@ -115,7 +115,7 @@ std::vector<std::string> names() {
     return found;
 }
 
-// A name of letters and digits alone, as a test's must be.
+// A name of letters and digits only, as GoogleTest requires.
 std::string testName(const testing::TestParamInfo<std::string>& info) {
     std::string name;
     std::copy_if(info.param.begin(), info.param.end(), std::back_inserter(name),

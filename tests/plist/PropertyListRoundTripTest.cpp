@@ -13,10 +13,10 @@ namespace {
 
 namespace any = doubles::any;
 
-/// Which values a form can hold.
+/// The values that a form can represent.
 enum class Reach { kBinary, kXml, kText };
 
-/// How many elements a container or text has: few, so that nested ones stay small.
+/// The number of elements of a container or text: small, so that nested ones stay small.
 int anyCount() {
     constexpr int kMostElements = 5;
     return any::between(0, kMostElements + 1);
@@ -84,7 +84,7 @@ PropertyList anyValue(Reach reach, int depth) {
 
 constexpr int kDepth = 3;
 
-/// A writer of the text form that knows but one way to write each value.
+/// Writes the text form, with one way for each value.
 void appendAsText(std::string& out, const PropertyList& object);
 
 void appendQuoted(std::string& out, std::string_view text) {

@@ -8,20 +8,20 @@
 #include <string_view>
 #include <vector>
 
-/// What the tests of the property-list codecs share.
+/// Shared by the tests of the property-list codecs.
 namespace pallax {
 
 inline ByteBuffer bytesOf(std::string_view text) {
     return {text.begin(), text.end()};
 }
 
-/// "at byte 3: …", or "" when the result is none.
+/// "at byte 3: …", or "" if there is a value.
 template <class Value>
 std::string refusalOf(const Result<Value, CodecError>& result) {
     return result ? std::string() : result.error().text();
 }
 
-/// The value, or null with a failed expectation that tells why.
+/// The value, or null with a failed expectation that shows the reason.
 inline PropertyList valueOf(const PropertyListResult& result) {
     EXPECT_EQ(refusalOf(result), "");
     return result ? *result : PropertyList();
@@ -36,7 +36,7 @@ inline std::string repeated(std::string_view text, std::size_t count) {
     return out;
 }
 
-/// `depth` arrays inside one another, the innermost empty.
+/// `depth` nested arrays, the innermost empty.
 inline PropertyList nestedArrays(std::size_t depth) {
     PropertyList result = Array{};
     for (; depth > 1; --depth) {
@@ -45,7 +45,7 @@ inline PropertyList nestedArrays(std::size_t depth) {
     return result;
 }
 
-/// How many containers lie inside one another on the path of first elements.
+/// The depth of nested containers along the first elements.
 inline std::size_t depthOf(PropertyList object) {
     std::size_t depth = 0;
     for (ArrayRef array = object.array(); array; array = object.array()) {
@@ -55,7 +55,7 @@ inline std::size_t depthOf(PropertyList object) {
     return depth;
 }
 
-/// A binary property list of exactly the objects given, with offsets of two bytes.
+/// A binary property list of exactly these objects, with offsets of two bytes.
 class BinaryFile {
 public:
     /// Each object's bytes, its marker first.

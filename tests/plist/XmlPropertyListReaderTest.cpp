@@ -23,7 +23,7 @@ PropertyList readValue(std::string_view element) {
     return read("<plist>" + std::string(element) + "</plist>");
 }
 
-/// Offsets are counted from the element: the <plist> before it is taken off.
+/// Offsets count from the element, without the <plist> before it.
 std::string refusalOfValue(std::string_view element) {
     constexpr std::string_view kOpening = "<plist>";
     const auto result = parse(std::string(kOpening) + std::string(element) + "</plist>");

@@ -48,7 +48,7 @@ TEST(XmlWritable, EachForbiddenCharacterIsReplacedByOne) {
     EXPECT_EQ(writable("\x1b[0m\x1f").object, PropertyList(replaced("?[0m?")));
     EXPECT_EQ(writable("\xEF\xBF\xBE\xEF\xBF\xBF").object, PropertyList(replaced("??")))
         << "U+FFFE and U+FFFF";
-    EXPECT_EQ(writable("\xEF\xBF\xBD").paths, Paths{}) << "it is allowed itself";
+    EXPECT_EQ(writable("\xEF\xBF\xBD").paths, Paths{}) << "U+FFFD itself is allowed";
 }
 
 TEST(XmlWritable, EachByteThatIsNoUtf8IsReplaced) {
@@ -69,7 +69,7 @@ TEST(XmlWritable, ThePathsOfTheValuesAreTold) {
                   {"Data", Array{"fine", Dictionary{{"Bad", replaced("?")}, {"Fine", "x"}},
                                  replaced("?")}}}));
     EXPECT_EQ(object.dictionary()->find("Data")->array()->at(2), PropertyList("\x02"))
-        << "the object itself stays as it is";
+        << "the object itself is unchanged";
 }
 
 TEST(XmlWritable, KeysAreReplacedAndNoEntryTakesTheOthersPlace) {

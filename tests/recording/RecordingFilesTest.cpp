@@ -146,7 +146,7 @@ TEST_F(RecordingFilesTest, WhatIsNoFileIsPassedOverAlsoWhereFilesAreReplaced) {
     ASSERT_EQ(::mkfifo(folder.file("a-0002.pcapng").c_str(), 0600), 0);
     const auto files = RecordingFiles::open(options);
     ASSERT_EQ(add(**files, seconds(0)), std::nullopt);
-    ASSERT_EQ(add(**files, seconds(1)), std::nullopt) << "nobody waits for a reader";
+    ASSERT_EQ(add(**files, seconds(1)), std::nullopt) << "it does not wait for a reader";
     EXPECT_EQ(packetsIn("a-0003.pcapng"), 1);
 }
 
@@ -217,12 +217,12 @@ TEST_F(RecordingFilesTest, PacketsOfAFileThatOthersInterfereWithDoNotCount) {
         ASSERT_EQ(add(**files, seconds(second)), std::nullopt);
     }
     EXPECT_EQ((*files)->check(), std::nullopt);
-    folder.write("a-0002.pcapng", ""); // the next packet would leave a hole in it
+    folder.write("a-0002.pcapng", ""); // truncates the current file
     const auto error = add(**files, seconds(13));
     ASSERT_TRUE(error);
     EXPECT_EQ(error->sentence, "The recording " + folder.file("a-0002.pcapng") +
                                    " was changed by another program while it was being written.");
-    EXPECT_EQ((*files)->packets(), 2U) << "those of the first file";
+    EXPECT_EQ((*files)->packets(), 2U) << "those in the first file";
     EXPECT_EQ(doubles::contentOf(folder.file("a-0002.pcapng")), "");
 }
 

@@ -51,7 +51,7 @@ std::vector<AnalyserItem> packetsIn(const std::string& text, const std::string& 
                 packets.push_back({line, {}});
             }
         } else if (inside) {
-            std::size_t depth = indent / kIndent - 1; // or less, of a label that begins with blanks
+            std::size_t depth = indent / kIndent - 1; // less for a label that begins with blanks
             AnalyserItem& holder = lastAt(packets.back(), depth);
             holder.items.push_back({line.substr((depth + 1) * kIndent), {}});
         }

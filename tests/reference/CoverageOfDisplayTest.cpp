@@ -9,14 +9,14 @@
 
 #include <algorithm>
 
-// What the generators show of samples and simulated modems against what is described.
+// Compares what the generators show for samples and simulated modems with the descriptions.
 
 namespace pallax {
 namespace {
 
 using doubles::Keys;
 
-/// Which sections of a technology hold what the telephony service sends, as it comes.
+/// The sections of a technology that show the telephony service's values unchanged.
 std::set<std::string> verbatimSections(const TechnologyReference& technology) {
     std::set<std::string> sections;
     for (const SectionReference& section : technology.sections) {
@@ -67,10 +67,10 @@ private:
 
     void seeValue(const std::string& section, const std::string& key, const PropertyList& value) {
         if (value.string() == "") {
-            return; // as the template left it, or not measured
+            return; // unchanged from the template, or not measured
         }
         if (_isIfx && value.dictionary() != nullptr) {
-            seeSection(section, value); // the keys within a key are the section's as well
+            seeSection(section, value); // nested keys also belong to the section
         }
         _keys[section].insert(key);
         if (const ArrayRef list = value.array()) {
@@ -91,7 +91,7 @@ private:
     Keys _keys;
 };
 
-/// What the generator of a technology shows over packets, each of which is looked at.
+/// The keys that a technology's generator shows after each of the packets.
 class DisplayOf {
 public:
     explicit DisplayOf(const TechnologyReference& technology)
@@ -121,7 +121,7 @@ private:
     ShownKeys _keys;
 };
 
-/// Over the samples, and over drives of several seeds.
+/// From the samples and from drives with several seeds.
 Keys keysShownBy(const TechnologyReference& technology) {
     DisplayOf display(technology);
     for (const SampleRecording& sample : samples()) {
@@ -135,7 +135,7 @@ Keys keysShownBy(const TechnologyReference& technology) {
         SimulationOptions options;
         options.technology = technology.technology;
         options.seed = seed;
-        options.packetsPerSecond = 8; // a display is looked through for each
+        options.packetsPerSecond = 8; // the display is searched after each
         options.duration = std::chrono::minutes(4);
         Simulation simulation(options);
         while (const auto packet = simulation.next()) {

@@ -66,7 +66,7 @@ TEST(Descriptions, EveryComputationIsOneOfTheDissectors) {
     }
 }
 
-/// The page's text without roff's marks.
+/// The page's text without roff markup.
 std::string plain(std::string page) {
     for (const auto& [mark, text] : std::map<std::string, std::string>{
              {"\\fB", ""}, {"\\fR", ""}, {"\\fI", ""}, {"\\-", "-"}, {"\\(aq", "'"}}) {

@@ -19,7 +19,7 @@ namespace {
 
 using Json = nlohmann::json;
 
-/// The display after each packet, by number; a packet that is dropped has none.
+/// The display after each packet, by number; a dropped packet has none.
 std::map<std::size_t, Json> decoded(const std::string& recording) {
     const auto run =
         runCommand(PALLAX_BINARY_DIR "/pallax decode --every packet " + recording + " 2>/dev/null");
@@ -33,7 +33,7 @@ std::map<std::size_t, Json> decoded(const std::string& recording) {
     return displays;
 }
 
-/// A text as the analyser shows it: each control character replaced.
+/// A text as the analyser shows it, with control characters replaced.
 std::string printable(const std::string& text) {
     std::string line;
     for (std::size_t at = 0; at < text.size();) {
@@ -52,7 +52,7 @@ std::string textOf(const Json& value) {
     return value.is_string() ? printable(value.get<std::string>()) : value.dump();
 }
 
-/// Numbers by what they are worth: the parser of the display does not keep how they are written.
+/// Compares numbers by value, because the JSON parser does not keep their notation.
 bool isSame(const std::string& text, const Json& value) {
     return value.is_number() ? Json::parse(text, nullptr, false) == value : text == textOf(value);
 }
@@ -66,7 +66,7 @@ bool isUnread(const AnalyserItem& packet) {
                        [](const AnalyserItem& item) { return item.label.ends_with("(not read)"); });
 }
 
-/// Whether a packet has brought more than empty lists.
+/// Whether a packet has added more than empty lists.
 bool bringsValues(const Json& before, const Json& after) {
     if (!after.is_object()) {
         return before != after;
@@ -78,12 +78,12 @@ bool bringsValues(const Json& before, const Json& after) {
     });
 }
 
-/// The dissector against the displays of one recording.
+/// Compares the dissector with the displays of one recording.
 class Comparison {
 public:
     const Compared& compared() const { return _compared; }
 
-    /// `packet` is what the analyser shows, `before` and `after` the display around it.
+    /// `packet` is the analyser's output, `before` and `after` are the displays around it.
     void compare(const AnalyserItem& packet, const Json& before, const Json& after) {
         for (const AnalyserItem& item : packet.items) {
             if (isSection(item)) {
@@ -97,7 +97,7 @@ public:
         }
     }
 
-    /// The same of an object stream, whose display is what the packet holds.
+    /// The same for an object stream, whose display is the packet's content.
     void compareObject(const AnalyserItem& packet, const Json& before, const Json& after) {
         ASSERT_FALSE(packet.items.empty());
         ASSERT_TRUE(isListLabel(packet.items.back())) << packet.items.back().label;
@@ -108,7 +108,7 @@ public:
         }
     }
 
-    /// A packet that is dropped leaves the display as it was: it must show no value.
+    /// A dropped packet does not change the display, so the analyser must show no values.
     static void compareDropped(const AnalyserItem& packet, bool isObject) {
         EXPECT_TRUE(isUnread(packet) || (isObject && packet.label.ends_with("unknown type)")))
             << packet.label;
@@ -182,7 +182,7 @@ private:
         }
     }
 
-    /// Everything that is shown on both sides, whatever the texts are.
+    /// Compares all content of both sides.
     void compareWhole(const std::vector<AnalyserItem>& items, const Json& shown) {
         if (!shown.is_structured()) {
             ASSERT_EQ(items.size(), 1U) << shown;
@@ -211,7 +211,7 @@ private:
         }
     }
 
-    /// Whatever the packet has changed is something that the analyser shows.
+    /// Checks that the analyser shows everything that the packet has changed.
     void expectChangesShown(const AnalyserItem& packet, const std::string& path, const Json& before,
                             const Json& after) {
         for (const auto& [key, value] : after.items()) {

@@ -10,29 +10,30 @@
 #include <string_view>
 #include <vector>
 
-/// The protocol analyser with the dissector against what `pallax decode` shows after each packet.
+/// Compares the protocol analyser with the dissector to the output of `pallax decode` after each
+/// packet.
 namespace pallax::doubles {
 
-/// A recording of the packets, a second apart, in the folder; technologies are named as on the
-/// command line.
+/// Writes a recording of the packets, a second apart, into the folder. Technologies are named as on
+/// the command line.
 std::string recordingOf(const TemporaryFolder& folder, std::string_view technology,
                         const std::vector<ByteBuffer>& packets);
 
-/// What the analyser writes of a recording with all details.
+/// The analyser's output for a recording with all details.
 std::string dissected(const std::string& recording, std::string_view technology);
 
-/// The same packet by packet.
+/// The same, divided into packets.
 std::vector<AnalyserItem> dissectedPackets(const std::string& recording,
                                            std::string_view technology);
 
 struct Compared {
-    std::size_t values = 0; ///< that were the same
-    /// Packets of which the dissector says that it has not read their property list, although it
-    /// has brought something to the display.
+    std::size_t values = 0; ///< values that were equal
+    /// Packets whose property list the dissector reports as not read, although it changed the
+    /// display.
     std::size_t unread = 0;
 };
 
-/// Compares every packet of a recording; what differs fails the test.
+/// Compares all packets of a recording; differences fail the test.
 Compared compareRecording(const std::string& recording, std::string_view technology);
 
 } // namespace pallax::doubles

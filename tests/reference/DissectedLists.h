@@ -26,7 +26,7 @@ inline ByteBuffer recordOf(std::uint32_t logCode, const ByteBuffer& list) {
     return doubles::Record(logCode).append(list).prefixed();
 }
 
-/// The list as a record, in XML and in binary.
+/// Adds the list as a record, in XML and in binary.
 inline void add(Packets& packets, std::uint32_t logCode, const PropertyList& list) {
     packets.push_back(recordOf(logCode, bytesOf(*serializeXml(list))));
     packets.push_back(recordOf(logCode, *serializeBinary(list)));
@@ -67,12 +67,12 @@ inline constexpr auto kSimFiles = std::to_array<const char*>(
      "kSimFile_PSLOCI", "kSimFile_ACC", "kSimFile_AD", "kSimFile_FPLMN", "kSimFile_AHPLMN",
      "kSimFile_RATMODE", "kSimFile_PNN", "kSimFile_OPL", "kSimFile_OPLMNAcT"});
 
-/// Runs the analyser on packets, and holds it against the displays.
+/// Runs the analyser on packets and compares it with the displays.
 class DissectedLists : public testing::Test {
 protected:
     void SetUp() override {
         if (!doubles::isInstalled("tshark")) {
-            GTEST_SKIP() << "tshark is not installed: the dissector is not run";
+            GTEST_SKIP() << "tshark is not installed";
         }
     }
 

@@ -6,8 +6,8 @@
 
 #include <limits>
 
-// The protocol analyser with the dissector against what `pallax decode` shows after each packet:
-// packets that are property lists.
+// Compares the protocol analyser with the dissector to the output of `pallax decode` after each
+// packet, for packets that are property lists.
 
 namespace pallax {
 namespace {
@@ -17,7 +17,7 @@ using doubles::compareRecording;
 
 class DissectorLists : public DissectedLists {};
 
-/// What is no cell, or none that is looked for, or lacks something.
+/// Values that are not cells, cells that do not match, and cells with missing keys.
 Array strangeCells() {
     Array all = cells("text");
     for (const PropertyList& element : cells(PropertyList::integer(5))) {
@@ -32,7 +32,7 @@ Array strangeCells() {
     return all;
 }
 
-/// Numbers that are readable as 32 bits, and some that are not.
+/// Numbers that fit into 32 bits, and some that do not.
 std::vector<PropertyList> numbers() {
     std::vector<PropertyList> all;
     for (const std::int64_t number :
@@ -55,7 +55,7 @@ std::vector<PropertyList> numbers() {
     return all;
 }
 
-/// Values in all the SIM files, over as many dictionaries as it takes.
+/// These values in all SIM files, in as many dictionaries as necessary.
 std::vector<Dictionary> simFilesOf(const std::vector<PropertyList>& values) {
     std::vector<Dictionary> all;
     for (std::size_t index = 0; index < values.size(); ++index) {

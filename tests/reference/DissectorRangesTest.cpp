@@ -16,7 +16,8 @@
 #include <string>
 #include <vector>
 
-// Which bytes the protocol analyser marks for a field, against the bytes that it is described with.
+// Compares the bytes that the protocol analyser marks for a field with the bytes in its
+// description.
 
 namespace pallax {
 namespace {
@@ -37,7 +38,7 @@ using Marks = std::map<std::string, MarkedBytes>;
 
 const std::string kSamples = PALLAX_SOURCE_DIR "/samples/";
 
-/// Of the fields under `filter` in the first packet of a recording that has one of them.
+/// The marks of the fields of `filter`, in the first packet of a recording that has one of them.
 Marks marked(const std::string& recording, const std::string& filter) {
     const auto run = doubles::runCommand("LC_ALL=C.UTF-8 tshark -X lua_script:" PALLAX_SOURCE_DIR
                                          "/extras/wireshark/pallax.lua -r " +
@@ -59,9 +60,9 @@ Marks marked(const std::string& recording, const std::string& filter) {
     return marks;
 }
 
-/// From the first byte to the last that a field is read from.
+/// From the first to the last byte of a field.
 MarkedBytes markedBytesOf(const FieldDescription& field) {
-    constexpr std::size_t kPrefix = 2; // of every packet of the samples
+    constexpr std::size_t kPrefix = 2; // in every packet of the samples
     const std::vector<Extent> extents =
         field.position ? std::vector<Extent>{extentOf(*field.position)} : field.read;
     std::size_t first = extents.at(0).byte;
@@ -73,7 +74,7 @@ MarkedBytes markedBytesOf(const FieldDescription& field) {
     return {kPrefix + first, end - first};
 }
 
-/// The same as one code of a section is described.
+/// The same according to the description of a section's code.
 Marks described(const std::string& technology, const std::string& sectionName, LogCode logCode) {
     const auto technologies = doubles::reference();
     const auto ofTechnology =
@@ -94,7 +95,7 @@ class DissectorRanges : public testing::Test {
 protected:
     void SetUp() override {
         if (!doubles::isInstalled("tshark")) {
-            GTEST_SKIP() << "tshark is not installed: the dissector is not run";
+            GTEST_SKIP() << "tshark is not installed";
         }
     }
 };
@@ -126,7 +127,7 @@ TEST_F(DissectorRanges, AComputedFieldMarksAllThatItIsMadeOf) {
     EXPECT_EQ(marks.at("Mobile Network Code"), (MarkedBytes{2 + 16, 2}));
 }
 
-/// Where bytes stand in a packet that holds them once.
+/// The position of bytes that a packet contains once.
 MarkedBytes placeOf(const ByteBuffer& packet, const std::string& bytes) {
     const std::string text(packet.begin(), packet.end());
     const std::size_t at = text.find(bytes);

@@ -2,8 +2,8 @@
 
 #include <gtest/gtest.h>
 
-// The protocol analyser with the dissector against what `pallax decode` shows after each packet:
-// property lists that are cut, spoilt, or larger than anybody sends.
+// Compares the protocol analyser with the dissector to the output of `pallax decode` after each
+// packet, for property lists that are cut, damaged or unusually large.
 
 namespace pallax {
 namespace {
@@ -12,8 +12,8 @@ using doubles::Compared;
 
 class DissectorSpoiltLists : public DissectedLists {};
 
-/// Cut at every length (of a long one every third), and with bytes that are spoilt; behind each
-/// comes `other`, so that what is shown by mistake is not what the display shows anyway.
+/// The packet cut at every length (at every third if it is long) and with damaged bytes. Each is
+/// followed by `other`, so that a value shown by mistake differs from the display.
 Packets mistreated(const ByteBuffer& packet, const ByteBuffer& other, std::size_t body) {
     Packets all;
     constexpr std::size_t kLong = 600;
@@ -47,7 +47,7 @@ Dictionary everySimFile(const PropertyList& value) {
     return files;
 }
 
-/// Arrays inside one another, around a text.
+/// Nested arrays around a text.
 PropertyList nestedArrays(int depth) {
     PropertyList value = "deep";
     for (int level = 0; level < depth; ++level) {
@@ -56,8 +56,8 @@ PropertyList nestedArrays(int depth) {
     return value;
 }
 
-/// A binary list of these objects, the first of which is the root; `starts` tells where they begin
-/// among `objects`.
+/// A binary list of these objects, the first of which is the root; `starts` are their positions in
+/// `objects`.
 ByteBuffer binaryList(const ByteBuffer& objects, const std::vector<std::size_t>& starts) {
     ByteBuffer list = bytesOf("bplist00");
     const std::size_t header = list.size();
@@ -79,8 +79,8 @@ ByteBuffer binaryList(const ByteBuffer& objects, const std::vector<std::size_t>&
     return list;
 }
 
-/// Arrays, each of which holds the next one `width` times; the last one holds the object of number
-/// `last`, which may be the text behind them.
+/// Arrays that each contain the next one `width` times; the last contains object number `last`,
+/// which may be the text after them.
 ByteBuffer sharingArrays(unsigned arrays, unsigned width, unsigned last) {
     ByteBuffer objects;
     std::vector<std::size_t> starts;
@@ -97,7 +97,7 @@ ByteBuffer sharingArrays(unsigned arrays, unsigned width, unsigned last) {
     return binaryList(objects, starts);
 }
 
-/// An array of `count` texts of 64 bytes, each of which begins 4 bytes behind the one before.
+/// An array of `count` texts of 64 bytes; each begins 4 bytes after the one before.
 ByteBuffer overlappingTexts(unsigned count) {
     constexpr std::uint8_t kLength = 64;
     ByteBuffer objects{0xAF, 0x11, static_cast<std::uint8_t>(count >> 8U),

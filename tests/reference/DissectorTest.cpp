@@ -7,8 +7,8 @@
 #include <map>
 #include <sstream>
 
-// The protocol analyser with the dissector against what `pallax decode` shows after each packet:
-// log records whose fields lie in bytes.
+// Compares the protocol analyser with the dissector to the output of `pallax decode` after each
+// packet, for log records with fields in bytes.
 
 namespace pallax {
 namespace {
@@ -21,11 +21,11 @@ class Dissector : public testing::Test {
 protected:
     void SetUp() override {
         if (!doubles::isInstalled("tshark")) {
-            GTEST_SKIP() << "tshark is not installed: the dissector is not run";
+            GTEST_SKIP() << "tshark is not installed";
         }
     }
 
-    /// Of each log code of a sample, property lists apart, the first packet.
+    /// The first packet of each log code in a sample, without property lists.
     static std::vector<ByteBuffer> oneOfEachCode(const SampleRecording& sample) {
         std::map<unsigned, ByteBuffer> packets;
         for (const TimedPacket& packet : sample.packets()) {

@@ -36,7 +36,7 @@ TEST(Meanings, EveryKeyAndSectionThatIsDescribedHasOne) {
     }
 }
 
-/// Key to the different sentences that the rows of a section have for it.
+/// Maps a key to the different sentences in the rows of a section.
 using Sentences = std::map<std::string, std::set<std::string_view>>;
 
 void addSentences(Sentences& sentences, const std::vector<FieldDescription>& fields) {

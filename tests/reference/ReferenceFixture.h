@@ -12,15 +12,15 @@
 
 namespace pallax::doubles {
 
-/// Section to its keys.
+/// Maps a section to its keys.
 using Keys = std::map<std::string, std::set<std::string>>;
 
-/// The descriptions of the source tree's templates.
+/// The descriptions from the source tree's templates.
 inline std::vector<TechnologyReference> reference() {
     return gatherReference(DirectoryResources(PALLAX_SOURCE_DIR "/resources"));
 }
 
-/// Calls `see` for every list of a code, also those within lists.
+/// Calls `see` for every list of a code, including nested ones.
 inline void forEachList(const std::vector<ListDescription>& lists,
                         const std::function<void(const ListDescription&)>& see) {
     for (const ListDescription& list : lists) {
@@ -37,7 +37,7 @@ inline void forEachList(const CodeDescription& code,
     }
 }
 
-/// The keys that a code shows (or reads and keeps from the display) in its section.
+/// The keys that a code shows in its section (or reads without showing).
 inline std::set<std::string> keysOf(const CodeDescription& code, bool shown) {
     std::set<std::string> keys;
     const auto add = [&keys](const std::string& key) {
@@ -65,7 +65,7 @@ inline std::set<std::string> keysOf(const CodeDescription& code, bool shown) {
     return keys;
 }
 
-/// Section to the keys that are described as shown, of one technology.
+/// The keys that are described as shown, by section.
 inline Keys shownKeys(const TechnologyReference& technology) {
     Keys keys;
     for (const SectionReference& section : technology.sections) {
@@ -80,7 +80,7 @@ inline Keys shownKeys(const TechnologyReference& technology) {
     return keys;
 }
 
-/// The same of those that are read and kept from the display, and are shown by no other code.
+/// The keys that are read but not shown by any code, by section.
 inline Keys hiddenKeys(const TechnologyReference& technology) {
     const Keys shown = shownKeys(technology);
     Keys keys;

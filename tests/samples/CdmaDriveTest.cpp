@@ -13,7 +13,7 @@ namespace {
 
 using doubles::RecordingLog;
 
-/// What the parsers make of the drive, with the template that is delivered.
+/// The parsers' display of the drive, with the installed template.
 class CdmaDrive : public testing::Test {
 protected:
     CdmaDrive() {
@@ -25,7 +25,7 @@ protected:
         (void)_log.take();
     }
 
-    /// Plays the whole drive and notes what each lookup name has shown.
+    /// Plays the whole drive and notes the values of each lookup name.
     void play() {
         for (const TimedPacket& packet : cdmaDrivePackets()) {
             _generator->updateState(_state, packet.data);
@@ -36,7 +36,7 @@ protected:
         }
     }
 
-    /// What a lookup name shows in its first place.
+    /// The value in the first place of a lookup name.
     static std::string valueOf(const Dictionary::Entry& name) {
         const DictionaryRef place = name.value.array()->front().dictionary();
         const std::string key = *place->find("key")->string();
@@ -79,7 +79,7 @@ TEST_F(CdmaDrive, EveryPacketIsOneThatItsParserReads) {
     for (const RecordingLog::Line& line : _log.lines()) {
         EXPECT_EQ(line.priority, 6) << line.text;
     }
-    EXPECT_EQ(_log.lines().size(), cdmaDrivePackets().size()) << "one for the header of each";
+    EXPECT_EQ(_log.lines().size(), cdmaDrivePackets().size()) << "one for each header";
 }
 
 } // namespace

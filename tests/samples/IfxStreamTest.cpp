@@ -11,7 +11,7 @@
 namespace pallax {
 namespace {
 
-/// What the generator makes of the stream, message by message.
+/// The generator's display of the stream, message by message.
 class IfxStream : public testing::Test {
 protected:
     void feed(const TimedPacket& packet) {
@@ -74,7 +74,7 @@ TEST_F(IfxStream, ACallComesAndGoesAndThreeCellsServe) {
     }
     EXPECT_EQ(states, (std::set<std::string>{"Connection Establishment", "Dedicated", "Idle"}));
     EXPECT_EQ(cells, (std::set<std::string>{"62", "71", "85"}));
-    EXPECT_EQ(hopping, 11U) << "seconds of the call";
+    EXPECT_EQ(hopping, 11U) << "the seconds of the call";
 }
 
 } // namespace

@@ -16,7 +16,7 @@ namespace {
 using doubles::GeneratorFixture;
 using doubles::RecordingLog;
 
-/// What the records make of the drive, packet by packet.
+/// The records' display of the drive, packet by packet.
 class UmtsDrive : public testing::Test {
 protected:
     UmtsDrive() {
@@ -67,7 +67,7 @@ TEST_F(UmtsDrive, EveryPacketIsOneThatItsRecordsCanRead) {
         EXPECT_NE(line.priority, 3) << line.text;
         warnings += line.priority == 4 ? 1 : 0;
     }
-    EXPECT_GT(warnings, umtsDrivePackets().size()) << "each reaches a record at least";
+    EXPECT_GT(warnings, umtsDrivePackets().size()) << "each reaches at least one record";
 }
 
 TEST_F(UmtsDrive, TheRankedSetsOfBothTechnologiesShowSideBySideAgainAndAgain) {
@@ -83,7 +83,7 @@ TEST_F(UmtsDrive, TheRankedSetsOfBothTechnologiesShowSideBySideAgainAndAgain) {
         feed(packet);
     }
     EXPECT_GE(both, 10);
-    EXPECT_GE(noActiveCell, 15) << "behind the hill there is none";
+    EXPECT_GE(noActiveCell, 15) << "none behind the hill";
 }
 
 } // namespace

@@ -25,7 +25,7 @@ protected:
     }
     void TearDown() override { std::filesystem::remove_all(_folder); }
 
-    /// Plays the whole drive, with a display every two seconds, and gives the last one.
+    /// Plays the whole drive with a display every two seconds and returns the last display.
     PropertyList play() {
         const auto generator = UTRANLogGenerator::generator(
             {_fixture.clock, _resources, _fixture.bundle, _fixture.standardOutput});

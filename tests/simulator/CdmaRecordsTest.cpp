@@ -63,7 +63,7 @@ TEST(CdmaRecords, TheEvdoStatesAreShownAsEncoded) {
     }));
 }
 
-/// Pilots with parts that their records can tell well.
+/// Pilots with values that their records represent exactly enough to compare.
 std::vector<cdma::Pilot> pilots(unsigned count) {
     std::vector<cdma::Pilot> list(count);
     for (cdma::Pilot& pilot : list) {

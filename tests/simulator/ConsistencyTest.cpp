@@ -2,7 +2,7 @@
 
 #include <optional>
 
-// That records of GSM/UMTS, UTRAN, CDMA and IFX agree with each other; LTE has a test of its own.
+// Checks that records of GSM/UMTS, UTRAN, CDMA and IFX agree with each other; LTE has its own test.
 
 namespace pallax {
 namespace {
@@ -11,7 +11,7 @@ using std::chrono::seconds;
 
 constexpr unsigned kRate = 5;
 
-/// What a drive on UMTS tells of its active cell.
+/// The active cell in the records of a UMTS drive.
 class ActiveCell {
 public:
     void look(const DecodedDisplay& decoded, std::uint32_t code) {
@@ -29,7 +29,7 @@ public:
             ++(set.front() == active.front() ? _same : _other);
         }
     }
-    /// The searcher tells of a cell later than the lists after a move, and only then.
+    /// Only after a move, the searcher reports the new cell later than the lists.
     void expectMostlyTheSame() const {
         constexpr std::size_t kFewTimes = 10;
         EXPECT_GT(_same, kFewTimes * _other) << _other;
@@ -62,7 +62,7 @@ TEST(Consistency, TheActiveUmtsCellIsInNoNeighbourList) {
         activeCell.look(moment.decoded, moment.code);
         const std::string now = moment.decoded.text("UMTS RR Info", "Cell ID");
         if (moment.code == 0xFF0001 && cellId != "(absent)") {
-            EXPECT_EQ(now, cellId) << "the list of cells tells of the same as the record before";
+            EXPECT_EQ(now, cellId) << "the cell monitor and the record before have the same cell";
         }
         cellId = now;
     });
@@ -84,7 +84,7 @@ TEST(Consistency, TheServingGsmCellIsNotItsOwnNeighbour) {
     });
 }
 
-/// What the list of cells tells of the serving cell is what the record before it told.
+/// Checks that the cell monitor reports the same serving cell as the record before.
 class SameIdentity {
 public:
     SameIdentity(std::string section, std::vector<std::string> keys)
@@ -134,7 +134,7 @@ TEST(Consistency, TheServingUtranCellIsTheSameInEveryRecordThatTellsOfIt) {
 
 TEST(Consistency, TheServingEvdoPilotIsInTheActiveSet) {
     std::optional<std::uint64_t> seed;
-    std::string before;  // the serving pilot that was told last
+    std::string before;  // the latest serving pilot
     std::string between; // the first of the active set since
     std::size_t compared = 0;
     inEveryDrive({"cdma", seconds(60), kRate}, [&](const DriveMoment& moment) {
@@ -244,7 +244,7 @@ TEST(Consistency, OnGsmThereIsNeitherAnUmtsConnectionNorAnActiveUmtsCell) {
 
 TEST(Consistency, TheSimTellsTheAreaInWhichThePhoneHasRegistered) {
     constexpr std::uint32_t kSimFiles = 0xFF0000;
-    constexpr std::size_t kAreaOffset = 7; // in the file: identity and network stand before
+    constexpr std::size_t kAreaOffset = 7; // in the file, after identity and network
     std::size_t compared = 0;
     inEveryDrive({"lte", seconds(120), kRate}, [&](const DriveMoment& moment) {
         if (moment.code != kSimFiles) {

@@ -9,13 +9,13 @@
 #include <string>
 #include <vector>
 
-/// Many drives of a technology, looked at packet by packet.
+/// Many drives of a technology, checked packet by packet.
 namespace pallax {
 
-/// A moment of a drive: a packet has just been decoded.
+/// The state of a drive after a packet was decoded.
 struct DriveMoment {
     const DecodedDisplay& decoded;
-    std::uint32_t code; ///< 0 of an object stream
+    std::uint32_t code; ///< 0 in an object stream
     Time time;
     std::uint64_t seed;
 };
@@ -23,7 +23,7 @@ struct DriveMoment {
 struct DriveOptions {
     std::string_view technology;
     std::chrono::seconds duration;
-    unsigned packetsPerSecond; ///< few, for every one is decoded; the drive is the same
+    unsigned packetsPerSecond; ///< few, because each packet is decoded; the drive is the same
 };
 
 /// Calls `check` after each packet, until a drive fails.
@@ -51,11 +51,11 @@ inline bool contains(const std::vector<std::string>& list, const std::string& te
     return std::find(list.begin(), list.end(), text) != list.end();
 }
 
-/// A shown quantity, one curve for each cell or channel that it is told of.
+/// A shown quantity, with one curve for each cell or channel.
 class Curve {
 public:
-    /// From `least` to `most`, and at most `largestStep` from one report to the next, where they
-    /// are less than two of the scenario's steps apart.
+    /// Values must lie between `least` and `most`, and reports less than two scenario steps apart
+    /// must not differ by more than `largestStep`.
     Curve(std::string name, double least, double most, double largestStep)
         : _name(std::move(name)), _least(least), _most(most), _largestStep(largestStep) {}
 
@@ -73,7 +73,7 @@ public:
         _last.insert_or_assign(of, Point{moment.seed, moment.time, value});
     }
     std::size_t seen() const { return _seen; }
-    /// How often a report was near enough to the one before to be compared with it.
+    /// The number of reports that were close enough to the one before to be compared with it.
     std::size_t compared() const { return _compared; }
 
 private:
@@ -92,7 +92,7 @@ private:
     std::map<std::string, Point> _last;
 };
 
-/// Fails where the levels do not fall, but for what two measurements may be apart.
+/// Fails if a level is above the one before by more than `apart`, the noise of two measurements.
 inline void expectStrongestFirst(const std::vector<std::string>& levels, double apart) {
     for (std::size_t index = 1; index < levels.size(); ++index) {
         EXPECT_LE(numberOf(levels[index]), numberOf(levels[index - 1]) + apart)

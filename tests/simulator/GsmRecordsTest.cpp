@@ -176,7 +176,7 @@ TEST(GsmRecords, TheMobilityStatesAreShownAsEncoded) {
                                  {ServiceState::AutomaticSearch, "REG_STATE_AUTOMATIC_SEARCH"},
                                  {ServiceState::Offline, "REG_STATE_OFFLINE"}});
         const auto selection = oneOf<unsigned>({{0, "Automatic"}, {1, "Manual"}, {2, "Limited"}});
-        // Of either mobility management the numbers that the simulator sends.
+        // States of both mobility managements that the simulator sends.
         const auto state =
             oneOf<unsigned>({{0, "MM_NULL"}, {3, "MM_LOCATION_UPDATE_INITIATED"}, {19, "MM_IDLE"}});
         const auto subState = oneOf<unsigned>({{0, "MM_NULL_SUBSTATE"},
@@ -284,7 +284,7 @@ TEST(GsmRecords, TheUmtsLinkIsShownAsEncoded) {
                                             {RrcState::CellPch, "CELL_PCH"},
                                             {RrcState::UraPch, "URA_PCH"}});
         const gsm::Ciphering ciphering{below(2) == 1};
-        // None that stands for "no value".
+        // Without the numbers for "no value".
         const std::array<int, 2> slots = {between(-50, -20), between(0, 24)};
         DecodedDisplay decoded("gsm");
         feedEncoded(decoded, identity);

@@ -18,8 +18,8 @@ std::string colours(ifx::ColourCode code) {
     return text(code.network) + "," + text(code.station);
 }
 
-/// Random values, and what the display makes of them: what stands alone in a dictionary stands
-/// without it, and the first element of a list is left out.
+/// Random values with their display: a dictionary of one entry is shown as its value, and the first
+/// element of a list is left out.
 struct RandomPicture {
     RandomPicture() {
         const auto state = oneOf<RrState>({{RrState::Off, "Off"},

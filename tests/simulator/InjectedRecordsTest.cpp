@@ -3,7 +3,7 @@
 #include "simulator/common/Subscriber.h"
 #include "tests/simulator/Values.h"
 
-// The records that the telephony service adds to those of a modem.
+// The records that the telephony service adds to a modem's.
 
 namespace pallax {
 namespace {
@@ -12,7 +12,7 @@ ListForm anyForm() {
     return below(2) == 0 ? ListForm::Xml : ListForm::Binary;
 }
 
-/// A display after one record with that property list.
+/// The display after one record with that property list.
 DecodedDisplay shown(std::string_view technology, std::uint32_t code, const PropertyList& object) {
     ByteBuffer bytes;
     encodePropertyList(code, object, anyForm(), bytes);

@@ -5,7 +5,7 @@
 
 #include <array>
 
-// Random values go through an encoder, and the display tells them again.
+// Encodes random values and compares them with the display.
 
 namespace pallax {
 namespace {
@@ -139,7 +139,7 @@ TEST(LteRecords, AConnectedMeasurementIsShownAsEncoded) {
             return lte::ConnectedCell{below(504), onGrid(-140, 0.25, 512), onGrid(-20, 0.125, 160)};
         };
         const lte::ConnectedCell serving = cell();
-        // No more than the receiver's 8-bit length check lets through.
+        // At most as many as the receiver's 8-bit length check accepts.
         std::vector<lte::ConnectedCell> measured(1 + below(20));
         std::vector<unsigned> detected(below(9));
         Array expected;

@@ -18,7 +18,7 @@ std::uint32_t codeOf(Bytes message) {
     return LogPacketGetLogCode(LogRecord(LogPacketStripPrefix(message)));
 }
 
-/// What holds after each packet of any drive; the number of neighbours that were compared.
+/// Checks the rules for each packet of any drive and returns the number of compared neighbours.
 std::size_t expectConsistent(const DecodedDisplay& decoded, std::uint32_t code) {
     const std::string serving = decoded.text(kInfoSection, "Physical Cell ID");
     std::vector<std::string> neighbours;
@@ -58,7 +58,7 @@ TEST(LteSimulation, TheRecordsAgreeAboutTheServingCellAndItsNeighbours) {
             decoded.feed(packet->data);
             const std::uint32_t code = codeOf(packet->data);
             neighbours += expectConsistent(decoded, code);
-            if (code == 0xFF0001) { // tells the same as the identity record before it
+            if (code == 0xFF0001) { // has the same content as the identity record before it
                 EXPECT_EQ(decoded.text(kInfoSection, "Physical Cell ID"), before);
                 EXPECT_EQ(decoded.text(kInfoSection, "Cell Identity"), identity);
             }
@@ -68,7 +68,7 @@ TEST(LteSimulation, TheRecordsAgreeAboutTheServingCellAndItsNeighbours) {
 }
 
 TEST(LteSimulation, LevelsAreInRangeAndMoveSmoothlyWhileOneCellServes) {
-    // A step of 200 ms at 17 m/s, with shadowing and noise at their bounds.
+    // For a step of 200 ms at 17 m/s, with the greatest shadowing and noise.
     constexpr double kLargestStepDb = 5;
     for (std::uint64_t seed = 0; seed < kSeeds && !testing::Test::HasFailure(); ++seed) {
         SCOPED_TRACE("seed " + std::to_string(seed));

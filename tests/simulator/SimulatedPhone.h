@@ -29,12 +29,12 @@ inline SimulationOptions simulationOf(std::string_view commandName, std::uint64_
     return options;
 }
 
-/// The number with which a shown value begins; 0 where none does.
+/// The number at the start of a shown value; 0 if there is none.
 inline double numberOf(const std::string& shown) {
     return std::strtod(shown.c_str(), nullptr);
 }
 
-/// A technology's real generator, whose display is read back.
+/// A technology's real generator with access to its display.
 class DecodedDisplay {
 public:
     explicit DecodedDisplay(std::string_view commandName)
@@ -54,11 +54,11 @@ public:
         const PropertyList* found = display() != nullptr ? display()->find(name) : nullptr;
         return found != nullptr ? *found : kNone;
     }
-    /// "(absent)" without it.
+    /// The text, or "(absent)".
     std::string text(std::string_view sectionName, std::string_view key) const {
         return textIn(section(sectionName), key);
     }
-    /// The texts under `key` in each entry of a list section.
+    /// The texts of `key` in each entry of a list section.
     std::vector<std::string> texts(std::string_view sectionName, std::string_view key) const {
         std::vector<std::string> all;
         if (const ArrayRef list = section(sectionName).array()) {

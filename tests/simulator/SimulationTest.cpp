@@ -78,7 +78,7 @@ TEST_P(SimulationOf, WithinAMinuteEverySectionThatCanBeFilledIs) {
     }
 }
 
-/// The codes that the start command asks for.
+/// The codes in the start command.
 std::set<std::uint32_t> wantedCodes(const LogGenerator& generator) {
     constexpr std::uint32_t kExtended = 0xFF0000;
     std::set<std::uint32_t> codes;

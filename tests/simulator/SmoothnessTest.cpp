@@ -1,24 +1,24 @@
 #include "tests/simulator/Drives.h"
 
-// That a drive looks like one: values in range, moving smoothly, neighbours that make sense. LTE
-// has a test of its own.
+// Checks that drives are plausible: values in range, smooth movements, sensible neighbours. LTE has
+// its own test.
 
 namespace pallax {
 namespace {
 
 using std::chrono::seconds;
 
-/// A second; the reports of a kind come less than two of the scenario's steps apart.
+/// Reports of a kind then come less than two scenario steps apart.
 constexpr unsigned kPacketsPerSecond = 10;
 
-/// A level moves so much within two steps of the scenario, with the noise of two measurements and
-/// the rounding to whole decibels.
+/// The greatest change of a level in two scenario steps, with the noise of two measurements and the
+/// rounding to whole decibels.
 constexpr double kLevelStepDb = 6;
-/// And so much where a hill comes between the phone and its cells.
+/// The same when a hill comes between the phone and its cells.
 constexpr double kHillStepDb = 10;
 
 TEST(Smoothness, GsmLevelsAreInRangeMoveSmoothlyAndNeighboursAreTheStrongest) {
-    constexpr double kNoiseDb = 6; // of two measurements, at their bounds and rounded
+    constexpr double kNoiseDb = 6; // the greatest noise of two measurements, rounded
     Curve serving("serving level", 35, 110, kLevelStepDb);
     Curve neighbour("neighbour level", 35, 110, kLevelStepDb);
     Curve cost("C1", 0, 70, kLevelStepDb);
@@ -41,7 +41,7 @@ TEST(Smoothness, GsmLevelsAreInRangeMoveSmoothlyAndNeighboursAreTheStrongest) {
         const auto codes = decoded.texts("Neighboring Cells", "BSIC");
         for (std::size_t index = 0; index < channels.size(); ++index) {
             neighbour.see(moment, channels[index], levels[index]);
-            levels[index].insert(0, "-"); // told without its sign
+            levels[index].insert(0, "-"); // shown without its sign
             if (codes[index] != "(absent)") {
                 EXPECT_EQ(bsics.emplace(channels[index], codes[index]).first->second, codes[index])
                     << "a cell changes its code";
@@ -102,7 +102,7 @@ TEST(Smoothness, NoMoreUmtsBlocksAreLostThanSent) {
 }
 
 TEST(Smoothness, UtranLevelsAndQualitiesAreInRangeAndMoveSmoothly) {
-    constexpr double kStepOfTheRecord = 0.3 * 256; // decibels that a level of 1 stands for
+    constexpr double kStepOfTheRecord = 0.3 * 256; // the decibels of one unit in the record
     constexpr double kNoise = 6 / kStepOfTheRecord;
     Curve level("RSCP", 0.01, 1, kLevelStepDb / kStepOfTheRecord);
     Curve errors("block errors", 0, 60, 18);
@@ -133,7 +133,7 @@ TEST(Smoothness, UtranLevelsAndQualitiesAreInRangeAndMoveSmoothly) {
     EXPECT_GT(ratio.compared(), 10U * PALLAX_DRIVES);
 }
 
-/// The curve of each pilot in a list of them, whose keys are "0;168" and the like.
+/// Adds each pilot of a list whose keys have the form "0;168".
 void seePilots(Curve& curve, const DriveMoment& moment, const PropertyList& list) {
     for (const Dictionary::Entry& entry : *list.dictionary()) {
         const std::string key(entry.key.view());
@@ -182,7 +182,7 @@ TEST(Smoothness, CdmaLevelsAndPilotsAreInRangeAndMoveSmoothly) {
 }
 
 TEST(Smoothness, CdmaDataRatesAreThoseOfALink) {
-    Curve forward("forward rate", 0, 2458, 2458); // kbit/s, the most that there is
+    Curve forward("forward rate", 0, 2458, 2458); // kbit/s, the greatest rate
     Curve reverse("reverse rate", 0, 1800, 1800);
     inEveryDrive({"cdma", seconds(60), kPacketsPerSecond}, [&](const DriveMoment& moment) {
         if (moment.code == 0x1192) {
@@ -196,7 +196,7 @@ TEST(Smoothness, CdmaDataRatesAreThoseOfALink) {
 }
 
 TEST(Smoothness, IfxLevelsAreInRangeMoveSmoothlyAndNeighboursAreTheStrongest) {
-    constexpr double kNoiseDb = 5.2; // of two measurements, at their bounds and rounded
+    constexpr double kNoiseDb = 5.2; // the greatest noise of two measurements, rounded
     Curve serving("serving level", -110, -35, kLevelStepDb);
     Curve cost("C1", -5, 70, kLevelStepDb);
     Curve neighbour("neighbour level", -110, -35, kLevelStepDb);
@@ -221,7 +221,7 @@ TEST(Smoothness, IfxLevelsAreInRangeMoveSmoothlyAndNeighboursAreTheStrongest) {
         std::vector<std::string> levels;
         for (const PropertyList& each : *decoded.section("Neighbour Cells").array()) {
             if (each.dictionary() == nullptr) {
-                continue; // a weak one: its channel alone
+                continue; // a weak one has only a channel
             }
             levels.push_back(DecodedDisplay::textIn(each, "Rx Level"));
             const std::string channel = DecodedDisplay::textIn(each, "ARFCN");

@@ -56,7 +56,7 @@ TEST(UtranRecords, MeasuredCellsAreShownAsEncoded) {
     }));
 }
 
-/// No display shows them: the bytes are compared.
+/// They are never shown, so the bytes are compared.
 TEST(UtranRecords, GsmNeighboursHaveTheirPlaces) {
     const std::array<utran::GsmNeighbour, 2> cells = {
         {{5, 1, true, 2, 7, 0x0123, -90}, {0x3FFF, 0, false, 0, 0, 17, -1}}};

@@ -7,7 +7,7 @@
 #include <string>
 #include <vector>
 
-/// Random values that an encoder takes, and how a display tells them.
+/// Random values for an encoder, with their display.
 namespace pallax {
 
 inline unsigned below(unsigned bound) {
@@ -16,7 +16,7 @@ inline unsigned below(unsigned bound) {
 inline int between(int least, int bound) {
     return doubles::any::between(least, bound);
 }
-/// A level on the grid of a record: `least` plus a number of steps.
+/// A level that a record can represent: `least` plus `count` steps.
 inline double onGrid(double least, double step, unsigned count) {
     return least + step * below(count);
 }
@@ -54,7 +54,7 @@ Labelled<Number> oneOf(const std::vector<Labelled<Number>>& all) {
     return all[below(static_cast<unsigned>(all.size()))];
 }
 
-/// The display of that technology after the record of `value`.
+/// The technology's display after the record of `value`.
 template <class Value>
 void feedEncoded(DecodedDisplay& decoded, const Value& value) {
     ByteBuffer bytes;

@@ -38,12 +38,12 @@ TEST(CodeFilter, OnlyTheNamedCodesAreWanted) {
     EXPECT_TRUE(filter->wants(record(1, 0x4116)));
     EXPECT_TRUE(filter->wants(prefixed(record(1, 0x4116))));
     EXPECT_TRUE(filter->wants(record(1, 0x108A)));
-    EXPECT_TRUE(filter->wants(record(2, 0x4116))); // the receiver judges the log type
+    EXPECT_TRUE(filter->wants(record(2, 0x4116))); // the receiver checks the log type
     EXPECT_FALSE(filter->wants(record(1, 0x4117)));
     EXPECT_TRUE(filter->wants(record(0xFF, 0x0020)));
-    EXPECT_FALSE(filter->wants(record(1, 0x0020)));    // the bare code is an extended one
-    EXPECT_FALSE(filter->wants(record(0xFF, 0x4116))); // and this one is not
-    EXPECT_FALSE(filter->wants(record(0xFF, 0x0001))); // "1" is no number
+    EXPECT_FALSE(filter->wants(record(1, 0x0020)));    // named only as an extended code
+    EXPECT_FALSE(filter->wants(record(0xFF, 0x4116))); // named only as a standard code
+    EXPECT_FALSE(filter->wants(record(0xFF, 0x0001))); // "1" is not a number
 }
 
 TEST(CodeFilter, WhatIsTooShortForACodePasses) {

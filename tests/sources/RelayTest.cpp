@@ -11,7 +11,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-/// A stream whose packets, of one byte each, come when the test says so.
+/// A stream whose packets, of one byte each, come when the test sends them.
 class Tap final : public PacketSource {
 public:
     explicit Tap(doubles::SteppedQueue& queue) : _queue(queue) {}
@@ -72,7 +72,7 @@ protected:
         _queue.runReady();
     }
 
-    /// What the source has now; 0 for the end.
+    /// The packets that the source has now; 0 for the end.
     static std::vector<int> take(PacketSource& source) {
         std::vector<int> bytes;
         for (;;) {
@@ -103,7 +103,7 @@ TEST_F(RelayTest, EverySourceThatHasBegunGetsEveryPacket) {
     EXPECT_EQ(first->technology(), "Zorell_LTE");
     EXPECT_EQ(take(*first), std::vector<int>());
     _tap->give({1, 2});
-    EXPECT_EQ(take(*second), std::vector<int>()) << "what came before its beginning is gone";
+    EXPECT_EQ(take(*second), std::vector<int>()) << "packets from before its beginning are gone";
     _tap->give({3});
     EXPECT_EQ(take(*first), (std::vector<int>{1, 2, 3}));
     EXPECT_EQ(take(*second), (std::vector<int>{3}));
@@ -120,7 +120,7 @@ TEST_F(RelayTest, ASourceThatWaitsIsToldOnceAndOneThatHasGoneNotAtAll) {
     EXPECT_EQ(told, 1);
     source->whenReady([&] { ++told; });
     _queue.runReady();
-    EXPECT_EQ(told, 2) << "it had not taken what was there";
+    EXPECT_EQ(told, 2) << "it had not read the waiting packets";
     EXPECT_EQ(take(*source), (std::vector<int>{1, 2}));
     source->whenReady([&] { ++told; });
     source.reset();
@@ -160,9 +160,9 @@ TEST_F(RelayTest, AnOrderlyEndComesAfterThePackets) {
     EXPECT_EQ(_ends, (std::vector<bool>{true}));
     EXPECT_EQ(take(*source), (std::vector<int>{1, 2, 0}));
     EXPECT_EQ(source->failure(), "");
-    EXPECT_EQ(take(*_relay->source()), (std::vector<int>{0})) << "nothing more will come";
+    EXPECT_EQ(take(*_relay->source()), (std::vector<int>{0})) << "no more packets will come";
     _queue.advance(60s);
-    EXPECT_EQ(_reports.size(), 1U) << "an end is no stall";
+    EXPECT_EQ(_reports.size(), 1U) << "an end is not a stall";
 }
 
 TEST_F(RelayTest, AStreamThatBreaksOffIsToldFromOneThatEnds) {
@@ -173,7 +173,7 @@ TEST_F(RelayTest, AStreamThatBreaksOffIsToldFromOneThatEnds) {
     EXPECT_EQ(_ends, (std::vector<bool>{false}));
 }
 
-/// A relay whose stream waits for its first source, for 20 seconds.
+/// A relay whose stream waits up to 20 seconds for its first source.
 class PatientRelayTest : public RelayTest {
 protected:
     PatientRelayTest() : RelayTest(20s) {}
@@ -183,7 +183,7 @@ TEST_F(PatientRelayTest, TheStreamWaitsForTheFirstSourceToBegin) {
     _tap->give({1, 2});
     const auto first = _relay->source();
     _queue.advance(15s);
-    EXPECT_EQ(_reports, Reports()) << "what waits has not stalled";
+    EXPECT_EQ(_reports, Reports()) << "waiting is not stalling";
     EXPECT_EQ(_tap->taken(), 0);
     EXPECT_EQ(take(*first), std::vector<int>());
     int told = 0;
@@ -192,12 +192,12 @@ TEST_F(PatientRelayTest, TheStreamWaitsForTheFirstSourceToBegin) {
     EXPECT_EQ(told, 1);
     EXPECT_EQ(take(*first), (std::vector<int>{1, 2}));
     const auto second = _relay->source();
-    EXPECT_EQ(take(*second), std::vector<int>()) << "it waits for the first alone";
+    EXPECT_EQ(take(*second), std::vector<int>()) << "it waits only for the first";
     _queue.advance(9s);
     EXPECT_EQ(_reports, Reports());
     _queue.advance(2s);
     EXPECT_EQ(_reports, (Reports{"The stream has stalled: no packet for 10 s."}))
-        << "counted from the beginning";
+        << "counted from the start";
     _tap->give({3});
     EXPECT_EQ(take(*first), (std::vector<int>{3}));
     EXPECT_EQ(take(*second), (std::vector<int>{3}));

@@ -29,7 +29,7 @@ protected:
         const auto opened = open(source);
         return opened ? "" : opened.error().sentence;
     }
-    /// A named pipe that a thread fills with the recording, once it is read.
+    /// A named pipe into which a thread writes the recording.
     std::string pipeOf(const std::string& recording) {
         const std::string pipe = _folder.file("pipe");
         EXPECT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
@@ -73,7 +73,7 @@ TEST_F(SourceFactoryTest, AFileIsReadFromItsStartByEachReader) {
     EXPECT_EQ(packetsOf(**opened->makeReader()), 3U);
     EXPECT_EQ(packetsOf(**opened->makeReader()), 3U);
     const Descriptor recorder(::open(path.c_str(), O_RDWR | O_CLOEXEC));
-    EXPECT_NE(::flock(recorder.number(), LOCK_EX | LOCK_NB), 0) << "no recorder may replace it";
+    EXPECT_NE(::flock(recorder.number(), LOCK_EX | LOCK_NB), 0) << "recorders must not replace it";
 }
 
 TEST_F(SourceFactoryTest, AStreamIsReadOnce) {

@@ -10,7 +10,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-/// Stands for what a stream's header opens.
+/// The recording that opening a stream's header returns.
 class NoPackets final : public Recording {
 public:
     const std::string& name() const override { return _name; }

@@ -10,7 +10,7 @@
 namespace pallax {
 namespace {
 
-/// A recording whose packets come when the test says so.
+/// A recording whose packets come when the test sends them.
 class LiveRecording final : public Recording {
 public:
     struct Tap {
@@ -28,8 +28,8 @@ public:
         std::condition_variable changed;
         int available = 0;
         int taken = 0;
-        int wanted = 0;        ///< of those taken, so many the source was asked for
-        int furthestAhead = 0; ///< most packets that were taken and not yet wanted
+        int wanted = 0;        ///< how many of those were requested from the source
+        int furthestAhead = 0; ///< the most packets taken but not yet requested
         bool ended = false;
     };
 
@@ -60,7 +60,7 @@ private:
 
 class StreamSourceTest : public testing::Test {
 protected:
-    /// Takes packets until there is nothing now; their bytes.
+    /// Takes packets until none is available and returns their bytes.
     std::vector<int> takeAll(StreamSource& source) {
         std::vector<int> bytes;
         for (auto next = source.next(); next.state != PacketSource::State::Later;
@@ -108,7 +108,7 @@ TEST_F(StreamSourceTest, ReadsAheadOnlySoFar) {
     constexpr int kPackets = 2000;
     constexpr int kMost = StreamSource::kMostAhead;
     _tap->give(kPackets);
-    // The thread comes to its limit again for each packet that is taken, and never beyond it.
+    // The thread reaches its limit again after each packet, and never exceeds it.
     for (int wanted = 0; wanted < kPackets; ++wanted) {
         ASSERT_TRUE(runUntil(_queue, [&] {
             const std::lock_guard lock(_tap->mutex);
@@ -131,7 +131,7 @@ TEST_F(StreamSourceTest, MayBeDestroyedWhileItsThreadWaits) {
         StreamSource source(_queue, std::make_unique<LiveRecording>(_tap));
         source.whenReady([&] { told = true; });
     }
-    _tap->give(1); // the thread ends with it
+    _tap->give(1); // after it the thread ends
     _tap->end();
     ASSERT_TRUE(runUntil(_queue, [&] { return _tap.use_count() == 1; }));
     EXPECT_FALSE(told);

@@ -13,7 +13,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-/// This test's own program is the child as well; see ServiceTestMain.cpp.
+/// The child is this test's own program; see ServiceTestMain.cpp.
 class ChildServiceTest : public testing::Test {
 protected:
     std::unique_ptr<ChildService> start(const std::string& recording) {

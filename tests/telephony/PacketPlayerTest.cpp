@@ -13,7 +13,7 @@ using namespace std::chrono_literals;
 
 constexpr std::chrono::seconds kFirst{1'000'000}; // the first packet's stamp
 
-/// Packets with a log code and no more, stamped in milliseconds after kFirst.
+/// Packets that consist of a log code, stamped in milliseconds after kFirst.
 class ListSource final : public PacketSource {
 public:
     struct Item {
@@ -49,7 +49,7 @@ public:
     bool canRestart = true;
     bool changesTechnology = false; ///< at its end
     std::vector<std::string> selected;
-    std::size_t holdBackAt = kNever; ///< the packet that has not come yet
+    std::size_t holdBackAt = kNever; ///< a packet that is not available yet
     std::string broken;
     std::function<void()> ready;
 
@@ -91,7 +91,7 @@ public:
     }
 
     std::vector<std::string> diary;
-    bool holds = false; ///< the receiver takes nothing
+    bool holds = false; ///< the receiver reads nothing
     int flushes = 0;
     std::function<void()> held;
 
@@ -148,7 +148,7 @@ TEST_F(PacketPlayerTest, KeepsTheSourcesTimingAndReachesTheTickAfterTheLastPacke
 
 TEST_F(PacketPlayerTest, TheSourceIsToldWhatIsWanted) {
     play({{0ms, 1}});
-    EXPECT_EQ(_source->selected, (std::vector<std::string>{"with 5"})) << "before it is asked";
+    EXPECT_EQ(_source->selected, (std::vector<std::string>{"with 5"})) << "before it is requested";
     _player->play(*CodeFilter::fromStartCommand({{"SetState", "Streaming"}}, false));
     EXPECT_EQ(_source->selected, (std::vector<std::string>{"with 5", "without 5"}));
 }
@@ -164,7 +164,7 @@ TEST_F(PacketPlayerTest, ANewTechnologyEndsThePlayAfterWhatCameBefore) {
                             [&] {
                                 ++changes;
                                 EXPECT_EQ(_sink.pending(), 0U);
-                                _player.reset(); // as the channel does
+                                _player.reset(); // like the channel
                             }});
     _player->play(everything());
     _queue.advance(10s);
@@ -248,7 +248,7 @@ TEST_F(PacketPlayerTest, ASlowReceiverStopsThePlayerAndNothingIsDropped) {
     _sink.holds = true;
     play(items, at(PlayOptions::kAsFastAsTaken));
     _queue.advance(10s);
-    EXPECT_EQ(_sink.flushes, 1); // one chunk is under way, and no more
+    EXPECT_EQ(_sink.flushes, 1); // only one chunk is being sent
     EXPECT_LT(_sink.diary.size(), 2100U);
     _sink.holds = false;
     _sink.held();

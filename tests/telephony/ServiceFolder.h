@@ -21,7 +21,7 @@ inline PropertyList comparable(const std::optional<Dictionary>& message) {
     return message ? PropertyList(*message) : PropertyList();
 }
 
-/// A log record with nothing but its header: `type` 1 or 0xFF, and the 16-bit code.
+/// A log record that is only a header: `type` 1 or 0xFF, and the 16-bit code.
 inline ByteBuffer logRecord(std::uint8_t type, std::uint16_t code) {
     constexpr std::size_t kHeaderSize = 13;
     ByteBuffer bytes(kHeaderSize);
@@ -31,7 +31,7 @@ inline ByteBuffer logRecord(std::uint8_t type, std::uint16_t code) {
     return bytes;
 }
 
-/// Records `count` packets with the codes 1, 2, 3, … and 100 ms between them.
+/// Writes a recording of `count` packets with the codes 1, 2, 3, …, 100 ms apart.
 inline std::string recordLte(const doubles::RuntimeFolder& folder, int count) {
     constexpr int kZorellLte = 150;
     const std::string path = folder.file("lte.pcap");

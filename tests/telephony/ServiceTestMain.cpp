@@ -1,4 +1,4 @@
-// The tests' main, which is also the child service's, as the command's own is.
+// The main function of the tests and of their child service, like the command's own.
 
 #include "telephony/ChildService.h"
 #include "tests/doubles/TestRun.h"

@@ -13,10 +13,10 @@ using namespace std::chrono_literals;
 constexpr int kPackets = 3000;
 constexpr std::size_t kPacketSize = 1000;
 
-/// One service and several clients, each with a local port name and a start command of its own.
+/// One service and several clients, each with its own local port name and start command.
 class SeveralClientsTest : public testing::Test {
 protected:
-    /// A client on the test's own queue.
+    /// A client on the test's queue.
     struct Client {
         std::unique_ptr<LocalMessagePort> local;
         std::unique_ptr<RemoteMessagePort> remote;
@@ -28,7 +28,7 @@ protected:
         _server.reset();
     }
 
-    /// Three seconds of packets, a thousand a second, with the codes 1, 2, 1, 2, …
+    /// Three seconds with a thousand packets a second, of the codes 1, 2, 1, 2, …
     std::string recordMuch() const {
         constexpr int kZorellLte = 150;
         const std::string path = _folder.file("much.pcap");
@@ -83,7 +83,7 @@ protected:
     }
 
     doubles::RuntimeFolder _folder;
-    std::vector<std::string> _reports; // read once the other side has ended
+    std::vector<std::string> _reports; // read after the other side has ended
     OtherProcess _other;
     SocketMessagePorts _serverPorts{_other.queue, openDirectory()};
     std::unique_ptr<TelephonyServer> _server;
@@ -158,7 +158,7 @@ TEST_F(SeveralClientsTest, AClientThatCatchesUpGetsWhatWaitedForItAndThenWhatCom
     for (std::size_t index = 1; index < _reports.size(); index += 2) {
         told += std::stoll(_reports[index].substr(std::string_view("slow has caught up: ").size()));
     }
-    EXPECT_EQ(told, dropped) << "every drop is told";
+    EXPECT_EQ(told, dropped) << "every drop is reported";
 }
 
 TEST_F(SeveralClientsTest, WhereTheClientSetsThePaceNothingIsLost) {
@@ -171,7 +171,7 @@ TEST_F(SeveralClientsTest, WhereTheClientSetsThePaceNothingIsLost) {
     ASSERT_TRUE(runUntil(_queue, [&] { return quick->codes.size() == kPackets; }));
     const ServiceStatus before = status();
     EXPECT_GT(before.clients[0].sent, 0);
-    EXPECT_LT(before.clients[0].sent, kPackets) << "it is waited for";
+    EXPECT_LT(before.clients[0].sent, kPackets) << "the player waits for it";
     slow->local->setDispatchQueue(_queue);
     ASSERT_TRUE(runUntil(_queue, [&] { return slow->codes.size() == kPackets; }));
     EXPECT_EQ(status().sent, 2 * kPackets);
@@ -189,7 +189,7 @@ TEST_F(SeveralClientsTest, AServiceThatTakesNoConnectionGivesNoStatus) {
     const std::string name(kTelephonyControlPort);
     const Descriptor listener = listenAt(*_ports.directory().socketPath(name)); // accepts nothing
     std::vector<std::unique_ptr<RemoteMessagePort>> waiting;
-    do { // until no other connection can wait
+    do { // until no further connection can wait
         waiting.push_back(_ports.createRemote(name));
     } while (waiting.back() != nullptr);
     EXPECT_EQ(askStatus(_ports, name).error().sentence, "The telephony service does not answer.");

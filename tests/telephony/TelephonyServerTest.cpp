@@ -15,7 +15,7 @@ namespace {
 
 using namespace std::chrono_literals;
 
-/// The server runs on a queue of its own, as in another process; the client is the viewer's side.
+/// The server runs on its own queue, as in another process; the client is the viewer's side.
 class TelephonyServerTest : public testing::Test {
 protected:
     void start(std::string recording,
@@ -32,7 +32,7 @@ protected:
         _server.reset();
     }
 
-    /// What a viewer does up to the start command.
+    /// The steps of a viewer before the start command.
     LogChannel openChannel() {
         auto local = _ports.createLocal("viewer", [this](std::int32_t identifier, Bytes data) {
             EXPECT_EQ(identifier, 0);
@@ -94,7 +94,7 @@ TEST_F(TelephonyServerTest, ServesARecordingFromTheStartCommandOn) {
     EXPECT_EQ(_codes.size(), 0U); // nothing before the start command
     EXPECT_EQ(send(*remote, startCommand(25), false).error, SendError::None);
     ASSERT_TRUE(runUntil(_queue, [&] { return ended; }));
-    ASSERT_EQ(_codes.size(), 25U); // 26 to 30 were not asked for
+    ASSERT_EQ(_codes.size(), 25U); // 26 to 30 were not requested
     for (int index = 0; index < 25; ++index) {
         EXPECT_EQ(_codes[static_cast<std::size_t>(index)], index + 1);
         EXPECT_EQ(_times[static_cast<std::size_t>(index)], index * 100ms);
@@ -176,8 +176,9 @@ TEST_F(TelephonyServerTest, AChannelEndsWhenItsSourceHasAnotherTechnology) {
     _server = std::move(server).value();
     const auto remote = _ports.createRemote(openChannel().remotePortName.value_or(""));
     ASSERT_EQ(send(*remote, startCommand(1), false).error, SendError::None);
-    EXPECT_TRUE(runUntil(_queue, [&] { return !remote->isValid(); })) << "so its client asks anew";
-    EXPECT_EQ(_codes, std::vector<int>{1}) << "what came before has arrived";
+    EXPECT_TRUE(runUntil(_queue, [&] { return !remote->isValid(); }))
+        << "so its client connects again";
+    EXPECT_EQ(_codes, std::vector<int>{1}) << "earlier packets have arrived";
     _other.end();
     EXPECT_EQ(_server->channelCount(), 0U);
     EXPECT_EQ(_reports, std::vector<std::string>());
@@ -222,7 +223,7 @@ TEST_F(TelephonyServerTest, OneStartedChannelMoreThanTheMostIsRefused) {
     const auto begin = [this](const LogChannel& channel) {
         const auto remote = _ports.createRemote(channel.remotePortName.value_or(""));
         ASSERT_NE(remote, nullptr);
-        // What follows is handled behind it, so that its reply says that it was.
+        // Requests are handled in order, so the next reply shows that the command was.
         ASSERT_EQ(send(*remote, startCommand(0), false).error, SendError::None);
         ASSERT_TRUE(send(*remote, {{"GetTechnology", "GetTechnology"}}, true).reply);
     };
@@ -261,7 +262,7 @@ TEST_F(TelephonyServerTest, ForOneChannelMoreThanTheMostTheOldestThatWasNotStart
 }
 
 TEST_F(TelephonyServerTest, AChannelThatIsNotStartedIsClosedAfter10Seconds) {
-    doubles::SteppedQueue timers; // as the server, it runs on the other queue
+    doubles::SteppedQueue timers; // on the other queue, like the server
     auto server = TelephonyServer::start(
         {_other.queue,
          _serverPorts,
@@ -292,7 +293,7 @@ TEST_F(TelephonyServerTest, AChannelThatIsNotStartedIsClosedAfter10Seconds) {
     ASSERT_EQ(send(*started, startCommand(1), false).error, SendError::None);
     pass(9s);
     EXPECT_TRUE(send(*idle, {{"GetTechnology", "GetTechnology"}}, true).reply)
-        << "to ask is not to start";
+        << "a query does not start it";
     EXPECT_TRUE(send(*started, {{"GetTechnology", "GetTechnology"}}, true).reply);
     pass(1s);
     EXPECT_TRUE(runUntil(_queue, [&] { return !idle->isValid(); }));

@@ -64,7 +64,7 @@ TEST(Printable, APieceMayEndInsideACharacter) {
     EXPECT_EQ(out, "a\\u009Bb\\u202E\U0001F4F6z");
 }
 
-/// Any bytes, with many of the characters that are to stay away from a terminal.
+/// Random bytes with many characters that must not reach a terminal.
 std::string anyText() {
     std::string text;
     for (int count = doubles::any::between(0, 30); count > 0; --count) {
@@ -85,7 +85,7 @@ std::string anyText() {
     return text;
 }
 
-/// Written out again, so that the property does not rest on the function that it checks.
+/// A second implementation, so that the property does not depend on the tested function.
 bool isHarmless(char32_t codePoint) {
     const bool isControl = codePoint < 0x20 || (codePoint >= 0x7F && codePoint <= 0x9F);
     const bool turns = codePoint == 0x061C || codePoint == 0x200E || codePoint == 0x200F ||
@@ -117,7 +117,7 @@ TEST(Printable, WhateverTextComesNothingOfItCommandsTheTerminal) {
 
 TEST(Printable, PiecesGiveWhatTheWholeGives) {
     EXPECT_TRUE(doubles::holds([] {
-        const std::string text = anyText() + "."; // no character begins at its end
+        const std::string text = anyText() + "."; // ends with a whole character
         PrintablePieces pieces;
         std::string out;
         for (std::size_t at = 0; at < text.size();) {

@@ -77,7 +77,7 @@ TEST_F(FrontEndAlertTest, EnterEscSpaceQAndAClickCloseIt) {
         (void)stage.frontEnd.draw();
         stage.frontEnd.handle(closing);
         EXPECT_FALSE(isOpen());
-        EXPECT_EQ(stage.depth(), 2U); // what lies below took no key
+        EXPECT_EQ(stage.depth(), 2U); // the panes below got no key
     }
     EXPECT_EQ(stage.quits, 0);
 }
@@ -101,7 +101,7 @@ TEST_F(FrontEndAlertTest, AnAlertLiesOverTheSaveScreenToo) {
     EXPECT_EQ(stage.line(4), "│  ┌ File Error ────────────────────┐  │");
     stage.press(Key::Escape);
     EXPECT_FALSE(isOpen());
-    EXPECT_NE(stage.saveScreen(), nullptr); // Esc was the alert's
+    EXPECT_NE(stage.saveScreen(), nullptr); // the alert took Esc
 }
 
 TEST_F(FrontEndAlertTest, AnAlertLiesOverTheHelpPageToo) {

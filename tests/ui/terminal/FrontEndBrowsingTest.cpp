@@ -137,7 +137,7 @@ TEST_F(FrontEndBrowsingTest, RightScrollsALongRowToItsEndAndLeftBackToItsStartTh
     EXPECT_EQ(stage.line(2), "▌f 22 columns..     a value of 20 col…");
     stage.type("l");
     EXPECT_EQ(stage.line(2), "▌umns..     a value of 20 column");
-    // The layout's content is both texts wider than the row: 42 columns.
+    // The layout's content exceeds the row by the width of both texts: 42 columns.
     stage.press(Key::Right, 9);
     EXPECT_EQ(stage.table().sidewaysOffset(), 42);
     EXPECT_EQ(stage.depth(), 2U); // a leaf opens nothing at the end
@@ -174,7 +174,7 @@ TEST_F(FrontEndBrowsingTest, YCopiesTheValueAndSaysSoUntilTheNextKey) {
 TEST_F(FrontEndBrowsingTest, AMessageGoesAtAnyKeyAndTheKeyStillDoesItsOwn) {
     stage.frontEnd.setMessage("Saved");
     const int displays = stage.displays;
-    stage.press(Key::Tab); // which does nothing by itself
+    stage.press(Key::Tab); // has no effect alone
     EXPECT_EQ(stage.displays, displays + 1);
     EXPECT_EQ(stage.screen().find("Saved"), std::string::npos);
     stage.frontEnd.setMessage("Saved");
@@ -192,7 +192,7 @@ TEST_F(FrontEndBrowsingTest, ControlLRepaintsAndChangesNothing) {
     const std::string before = stage.screen();
     stage.pressControl('l');
     EXPECT_EQ(stage.repaints, 1);
-    EXPECT_EQ(stage.screen(), before); // the message too is still there
+    EXPECT_EQ(stage.screen(), before); // the message is also still shown
 }
 
 TEST_F(FrontEndBrowsingTest, SOpensTheSaveScreen) {

@@ -68,7 +68,7 @@ TEST_F(FrontEndFilterTest, EnterKeepsTheFilterAndEscClearsItLaterBeforeItGoesBac
     stage.type("/rsrp");
     stage.press(Key::Enter);
     EXPECT_EQ(stage.pane().filter(), "rsrp");
-    stage.type("j"); // a key of the pane again
+    stage.type("j"); // goes to the pane again
     EXPECT_EQ(stage.cursorName(), "Average RSRP");
     stage.press(Key::Escape);
     EXPECT_EQ(stage.pane().filter(), "");
@@ -164,7 +164,7 @@ TEST_F(FrontEndFilterTest, TypingEndsWhenAClickOpensAnotherPane) {
     EXPECT_EQ(draw().cursor(), std::nullopt);
     stage.type("q");
     EXPECT_EQ(stage.depth(), 1U);
-    EXPECT_EQ(stage.pane().filter(), "info"); // kept, but not typed any more
+    EXPECT_EQ(stage.pane().filter(), "info"); // kept, but no longer edited
     EXPECT_EQ(stage.line(4), " …11-14 at 22:13:20");
 }
 

@@ -184,7 +184,7 @@ TEST_F(FrontEndHelpTest, ItOpensAtItsFirstLineAgain) {
     EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
 }
 
-/// The words of the help page's left column.
+/// The words in the left column of the help page.
 std::vector<std::string> namedKeys() {
     constexpr std::size_t kColumn = 18;
     std::vector<std::string> names;
@@ -220,7 +220,7 @@ TEST_F(FrontEndHelpTest, EveryCharacterThatDoesSomethingIsNamed) {
         fresh.type(name);
         const bool didSomething = fresh.displays != displays || fresh.startsAfresh > 0;
         const bool isNamed = std::find(names.begin(), names.end(), name) != names.end();
-        // Where it would scroll or open, 'l' finds nothing to do on this row.
+        // 'l' would scroll or open, but has no effect on this row.
         EXPECT_EQ(didSomething || character == 'l', isNamed) << name;
     }
 }

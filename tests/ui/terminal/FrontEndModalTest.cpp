@@ -20,7 +20,7 @@ protected:
         EXPECT_NE(stage.saveScreen(), nullptr);
     }
 
-    /// Which part has the keys.
+    /// The part that takes the keys.
     std::string focus() {
         const Grid grid = draw();
         if (grid.cursor()) {
@@ -45,13 +45,13 @@ protected:
         stage.type("s");
         (void)draw();
     }
-    /// The first and the last item that are seen.
+    /// The first and the last visible item.
     std::string itemsAfter(Key key) {
         constexpr std::size_t kNumber = std::string_view("│ ✓ Item ").size();
         stage.press(key);
         return stage.line(1).substr(kNumber, 1) + "-" + stage.line(4).substr(kNumber, 1);
     }
-    /// "saved TEXT", "open" or "closed", after what was posted has run.
+    /// "saved TEXT", "open" or "closed", after the posted blocks have run.
     std::string outcome() {
         stage.queue.runReady();
         const auto saved = stage.files.files.find(kPath);
@@ -198,7 +198,7 @@ TEST_F(FrontEndModalTest, PgDnAndPgUpScrollALongListByAPageEach) {
     EXPECT_EQ(itemsAfter(Key::PageDown), "5-8");
     EXPECT_EQ(itemsAfter(Key::PageUp), "2-5");
     EXPECT_EQ(itemsAfter(Key::PageUp), "0-3");
-    EXPECT_TRUE(draw().cursor().has_value()); // the description is edited all the while
+    EXPECT_TRUE(draw().cursor().has_value()); // the description stays editable
 }
 
 TEST_F(FrontEndModalTest, TheWheelScrollsALongList) {

@@ -14,7 +14,7 @@ protected:
         stage.saveHistory = snapshotItems();
         stage.frontEnd.resize(60, 12);
     }
-    /// Clicks the first place where the screen shows this text.
+    /// Clicks the first occurrence of this text on the screen.
     void clickOn(const std::string& text) {
         const Grid grid = draw();
         for (int y = 0; y < grid.rows(); ++y) {
@@ -111,7 +111,7 @@ TEST_F(FrontEndMouseTest, AClickOnATitleGoesBackToItsPane) {
 TEST_F(FrontEndMouseTest, AClickThatComesBeforeTheNextDrawingDoesNothing) {
     stage.click(5, 2);
     ASSERT_EQ(stage.depth(), 2U);
-    stage.mouse(Key::Click, 5, 2); // what was there is gone
+    stage.mouse(Key::Click, 5, 2); // nothing is there now
     EXPECT_EQ(stage.depth(), 2U);
     stage.press(Key::Left);
     EXPECT_EQ(stage.depth(), 1U);
@@ -181,8 +181,8 @@ TEST_F(FrontEndMouseTest, AClickOnTheBackgroundOrAnItemEndsEditingAndOnTheFieldB
 TEST_F(FrontEndMouseTest, NothingBelowTheSaveScreenCanBeClicked) {
     stage.type("s");
     stage.click(5, 0);
-    stage.click(56, 11); // where the help hint is
-    stage.click(45, 11); // and the save hint
+    stage.click(56, 11); // the place of the help hint
+    stage.click(45, 11); // and of the save hint
     stage.queue.runReady();
     EXPECT_EQ(stage.depth(), 1U);
     EXPECT_NE(stage.saveScreen(), nullptr);

@@ -13,7 +13,7 @@ namespace {
 
 namespace any = doubles::any;
 
-/// Bytes of a script: mostly what does something.
+/// Bytes of a script, most of which have an effect.
 int anyCode() {
     const int kind = any::between(0, 12);
     if (kind < 4) {

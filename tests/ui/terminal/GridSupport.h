@@ -13,11 +13,11 @@ inline void PrintTo(const Style& style, std::ostream* out) { // NOLINT: gtest's 
          << (style.underline ? " underline" : "") << (style.accent ? " accent" : "") << " }";
 }
 
-/// What is wrong with a grid as a thing that a terminal can show; empty when nothing is: every
-/// cell holds one printable character, and a wide one is followed by its right half.
+/// The fault of a grid that a terminal could not show, or "": each cell must contain one printable
+/// character, and a wide one must be followed by its right half.
 inline std::string faultOf(const Grid& grid) {
     for (int y = 0; y < grid.rows(); ++y) {
-        int halves = 0; // right halves that must follow
+        int halves = 0; // right halves still expected
         for (int x = 0; x < grid.columns(); ++x) {
             const std::string& text = grid.at(x, y).text;
             const std::string place = std::to_string(x) + "," + std::to_string(y);

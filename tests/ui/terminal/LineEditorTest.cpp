@@ -191,7 +191,7 @@ TEST_F(LineEditorTest, WhatIsNoCharacterIsNotTaken) {
 
 TEST_F(LineEditorTest, WhatIsTypedBeyondTheGreatestLengthIsDropped) {
     editor.setText(std::string(LineEditor::kMaximumBytes - 1, 'a'));
-    EXPECT_TRUE(press(U'é')); // two bytes, for which there is no room
+    EXPECT_TRUE(press(U'é')); // two bytes, which do not fit
     EXPECT_EQ(editor.text(), std::string(LineEditor::kMaximumBytes - 1, 'a'));
     EXPECT_TRUE(press(U'b'));
     EXPECT_TRUE(press(U'c'));

@@ -129,7 +129,7 @@ TEST_F(ModalViewTest, TheButtonWithTheKeysStandsOutWithoutColoursToo) {
     stage.press(Key::Enter);
     EXPECT_EQ(styleAt(19, 8), kFocus);
     EXPECT_EQ(styleAt(28, 8), Style{});
-    EXPECT_EQ(styleAt(15, 6), Style{}); // the text is not edited any more
+    EXPECT_EQ(styleAt(15, 6), Style{}); // the text is no longer edited
     EXPECT_EQ(draw().cursor(), std::nullopt);
     stage.press(Key::Tab);
     EXPECT_EQ(styleAt(19, 8), Style{});

@@ -12,7 +12,7 @@
 namespace pallax::terminal {
 namespace {
 
-/// A grid full of dots, to see what is drawn over.
+/// A grid full of dots, to show what is drawn over it.
 Grid dotted(int columns, int rows) {
     Grid grid(columns, rows);
     for (int y = 0; y < rows; ++y) {

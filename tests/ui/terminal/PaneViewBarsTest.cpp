@@ -94,7 +94,7 @@ TEST_F(PaneViewBarsTest, ANoteThatDoesNotFitBehindTheStatusStandsInTheRuleAboveI
 TEST_F(PaneViewBarsTest, TheStatusTextsTimeNamesItsZone) {
     stage.zone = "+0200";
     stage.frontEnd.resize(40, 12);
-    EXPECT_EQ(stage.line(11), " ⠋ Connecting            s Save  ? help") << "there is no time";
+    EXPECT_EQ(stage.line(11), " ⠋ Connecting            s Save  ? help") << "no time is shown";
     stage.tick(display());
     const std::pair<int, const char*> expected[] = {
         {80, " Updated 2023-11-14 at 22:13:20 +0200                  / filter  s Save  ? help"},

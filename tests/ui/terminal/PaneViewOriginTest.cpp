@@ -11,7 +11,7 @@
 namespace pallax::terminal {
 namespace {
 
-/// What the title and the line below it tell of where the values come from.
+/// The origin of the values in the title and the line below it.
 class PaneViewOriginTest : public StageFixture {
 protected:
     PaneViewOriginTest() { stage.tick(display()); }
@@ -112,7 +112,7 @@ TEST_F(PaneViewOriginTest, OldValuesAreToldAboveTheRows) {
         stage.frontEnd.resize(columns, 9);
         EXPECT_EQ(stage.line(1), line) << columns;
     }
-    stage.frontEnd.resize(60, 6); // rows above the window are still hinted at
+    stage.frontEnd.resize(60, 6); // the hint at rows above the window remains
     stage.press(Key::End);
     EXPECT_EQ(stage.line(1), " values from before 22:13:30: press R to start afresh ↑ 3 ─");
     stage.frontEnd.resize(40, 6);
@@ -125,7 +125,7 @@ TEST_F(PaneViewOriginTest, RStartsAfreshAndSoDoesAClickOnTheOffer) {
     stage.type("R");
     EXPECT_EQ(stage.startsAfresh, 1);
     stage.click(3, 1);
-    EXPECT_EQ(stage.startsAfresh, 1) << "nothing is offered there";
+    EXPECT_EQ(stage.startsAfresh, 1) << "the key has no effect there";
     stage.frontEnd.setOldValues("22:13:30");
     stage.click(3, 1);
     EXPECT_EQ(stage.startsAfresh, 2);
@@ -140,7 +140,7 @@ TEST_F(PaneViewOriginTest, RStartsAfreshAndSoDoesAClickOnTheOffer) {
     EXPECT_EQ(stage.startsAfresh, 3) << "it is typed";
     stage.press(Key::Tab);
     stage.type("R");
-    EXPECT_EQ(stage.startsAfresh, 3) << "not under the save screen";
+    EXPECT_EQ(stage.startsAfresh, 3) << "not below the save screen";
 }
 
 TEST_F(PaneViewOriginTest, InAsciiTheMarksAreAscii) {

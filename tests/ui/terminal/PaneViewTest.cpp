@@ -216,7 +216,7 @@ TEST_F(PaneViewTest, RowsAboveAndBelowTheWindowAreHintedAt) {
     EXPECT_EQ(stage.cursorName(), "Measured RSRP");
     stage.type("/measured");
     EXPECT_EQ(stage.line(1), " ──────────────────────────────────────")
-        << "all that match are seen";
+        << "all matches are visible";
     EXPECT_EQ(stage.line(5), " ──────────────────────────────────────");
 }
 
@@ -232,7 +232,7 @@ TEST_F(PaneViewTest, WhatIsWhereTellsItsStyle) {
     EXPECT_EQ(grid.at(0, 2).style, Style{.accent = true}); // the cursor's row
     EXPECT_EQ(grid.at(1, 2).style, (Style{.bold = true, .accent = true}));
     EXPECT_EQ(grid.at(39, 2).style, Style{.accent = true});
-    EXPECT_EQ(grid.at(0, 3).style, Style{}); // another one, a list
+    EXPECT_EQ(grid.at(0, 3).style, Style{}); // another row, a list
     EXPECT_EQ(grid.at(1, 3).style, Style{.bold = true});
     EXPECT_EQ(grid.at(37, 3).style, Style{.dim = true});
     EXPECT_EQ(grid.at(39, 3).style, Style{});

@@ -8,10 +8,10 @@
 
 namespace pallax::terminal {
 
-/// The stage, and how what is on it looks.
+/// The stage, with access to the styles on it.
 class StageFixture : public testing::Test {
 protected:
-    /// One section of these entries, opened.
+    /// Opens a section with these entries.
     void openSection(const Dictionary& section, const char* name = "Section") {
         stage.tick(Dictionary{{name, section}});
         stage.press(Key::Enter);

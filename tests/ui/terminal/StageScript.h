@@ -12,8 +12,8 @@
 
 namespace pallax::terminal {
 
-/// Plays bytes as what can happen to the front end: a byte below 0x80 is typed as it is, any other
-/// is a key, a resize, new data, and so on (see `act`), some of them with the bytes that follow.
+/// Plays bytes as events of the front end: a byte below 0x80 is typed; others are keys, a resize,
+/// new data, and so on (see `act`), some with arguments in the bytes that follow.
 class StageScript {
 public:
     explicit StageScript(std::span<const std::uint8_t> bytes) : _bytes(bytes) {
@@ -21,13 +21,13 @@ public:
         _stage.frontEnd.resize(kMostColumns / 2, kMostRows / 2);
     }
 
-    /// What went wrong; empty when nothing did.
+    /// The first fault, or "".
     std::string play() {
         std::string fault = check();
         while (fault.empty() && !_bytes.empty()) {
             const std::uint8_t code = next();
             act(code);
-            // Now and then several things happen before the next drawing.
+            // Sometimes several events happen before the next drawing.
             if (code != kNoDrawing) {
                 fault = check();
             }
@@ -37,7 +37,7 @@ public:
 
 private:
     static constexpr std::uint8_t kNoDrawing = 0xFF;
-    // Small, for every step draws a screen.
+    // Small, because every step draws a screen.
     static constexpr int kMostColumns = 64;
     static constexpr int kMostRows = 20;
     static constexpr auto kKeys = std::to_array<Key>(
@@ -107,7 +107,7 @@ private:
         }
     }
 
-    /// Displays of several kinds; their panes have names in common.
+    /// Displays of several kinds, whose panes share names.
     static PropertyList data(std::uint8_t kind) {
         constexpr int kMany = 50;
         switch (kind % 6) {

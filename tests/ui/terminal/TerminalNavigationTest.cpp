@@ -14,7 +14,7 @@ namespace {
 
 using Diary = std::vector<std::string>;
 
-/// What every screen of a stack is told, in its order.
+/// Notes the calls to every screen of a stack, in order.
 class DiaryPane final : public ui::TableScreen {
 public:
     DiaryPane(ui::Toolkit& toolkit, Diary& diary, std::string name)

@@ -46,7 +46,7 @@ protected:
         (void)::tcsetattr(descriptor, TCSANOW, &modes);
     }
 
-    /// As the user's Ctrl-S, which takes effect a moment later.
+    /// Stops the terminal, like the user's Ctrl-S, which takes effect a moment later.
     void stop() const {
         EXPECT_EQ(::write(master, "\x13", 1), 1);
         pollfd room{terminal, POLLOUT, 0};
@@ -57,14 +57,14 @@ protected:
         EXPECT_EQ(::poll(&room, 1, 0), 0) << "it is not stopped";
     }
 
-    /// Runs a process that does `action`, and returns the signal that it died of; 0 if it did not.
+    /// Runs `action` in a process and returns the signal that killed it, or 0.
     int signalAfter(const std::function<void()>& action) const {
         const pid_t child = ::fork();
         if (child == 0) {
             const rlimit none{0, 0};
             (void)::setrlimit(RLIMIT_CORE, &none);
             for (const int signal : {SIGSEGV, SIGBUS, SIGFPE, SIGILL, SIGABRT, SIGQUIT}) {
-                (void)std::signal(signal, SIG_DFL); // not what a sanitizer has set
+                (void)std::signal(signal, SIG_DFL); // instead of a sanitizer's handler
             }
             action();
             ::_exit(0);
@@ -74,7 +74,7 @@ protected:
         return WIFSIGNALED(status) ? WTERMSIG(status) : 0;
     }
 
-    /// What was written to the terminal.
+    /// The output on the terminal.
     std::string written() const {
         (void)::fcntl(master, F_SETFL, O_NONBLOCK);
         std::array<char, 1024> bytes{};
@@ -105,7 +105,7 @@ TEST_F(TerminalRestorerTest, RestoresTheTerminalAtASignalThatAsksForTheEndWhereN
         EXPECT_EQ(signalAfter([&] {
                       const TerminalRestorer restorer(terminal);
                       switchEchoOff(terminal);
-                      (void)std::signal(signal, SIG_DFL); // as a queue does that ends
+                      (void)std::signal(signal, SIG_DFL); // like a queue that ends
                       TerminalRestorer::guardEndings();
                       (void)std::raise(signal);
                   }),
@@ -190,7 +190,7 @@ TEST_F(TerminalRestorerTest, RestoresATerminalThatIsStopped) {
 }
 
 TEST_F(TerminalRestorerTest, ReleasesOutputThatIsHeldBack) {
-    TerminalRestorer::release(); // without a restorer, nothing
+    TerminalRestorer::release(); // has no effect without a restorer
     TerminalRestorer restorer(terminal);
     (void)::fcntl(terminal, F_SETFL, O_NONBLOCK);
     stop();

@@ -18,8 +18,8 @@
 
 namespace pallax::terminal {
 
-/// The terminal front end with the application's own panes and save screen, showing a display
-/// that the test sets. What the front end asks of its surroundings is counted.
+/// The terminal front end with the application's own panes and save screen. It shows a display that
+/// the test sets, and counts the front end's requests to its surroundings.
 class TerminalStage final : public PaneApplication, public ui::NavigationDelegate {
 public:
     explicit TerminalStage(const Marks& marks = kUtf8Marks)
@@ -45,14 +45,14 @@ public:
     std::vector<std::string> copied;
 
     bool savingAllowed = true;
-    std::optional<std::string> status; ///< null: as the state of the connection says
+    std::optional<std::string> status; ///< null: follows the connection
     doubles::FakeFileSystem files;
     doubles::ManualClock clock;
     doubles::SteppedQueue queue;
     PropertyList saveHistory;
 
-    /// New data: every pane is reloaded, or the stack goes back to below the first whose path has
-    /// vanished. A null display is what there is without a connection.
+    /// Shows new data: reloads every pane, or pops to below the first whose path has vanished. A
+    /// null display means no connection.
     void tick(const PropertyList& display) {
         PathDictionary paths;
         const NodeRef root = PallaxModelNode::makeTreeFromObject(display, paths);
@@ -88,13 +88,13 @@ public:
         frontEnd.handle({.key = Key::Character, .character = controlKey(letter)});
     }
     void mouse(Key key, int x, int y) { frontEnd.handle({.key = key, .x = x, .y = y}); }
-    /// The screen is drawn first: a click is meant for what is seen.
+    /// Draws the screen first, because a click refers to the visible screen.
     void click(int x, int y) {
         (void)frontEnd.draw();
         mouse(Key::Click, x, y);
     }
 
-    /// The screen as text, behind an empty line, so that it compares to a raw string.
+    /// The screen as text after an empty line, for comparison with a raw string.
     std::string screen() { return "\n" + frontEnd.draw().text(); }
     std::string screen(int columns, int rows) {
         frontEnd.resize(columns, rows);
@@ -117,7 +117,7 @@ public:
         _saveScreen = nullptr;
     }
 
-    // What panes ask of the application.
+    // Requests of the panes to the application.
     bool allowSaveButton() const override { return savingAllowed; }
     void showSaveView() override {
         if (_saveScreen) {
@@ -145,7 +145,7 @@ private:
 
     bool _isConnected = false;
     std::unique_ptr<ui::NavigationStack> _stack;
-    std::unique_ptr<ui::Window> _window; // goes before the stack
+    std::unique_ptr<ui::Window> _window; // destroyed before the stack
     std::shared_ptr<PallaxSaveViewController> _saveScreen;
 };
 

@@ -21,7 +21,7 @@ class TerminalTableTest : public testing::Test {
 protected:
     TerminalTableTest() { show(3); }
 
-    /// As a drawing does.
+    /// Like a drawing.
     void show(std::size_t rows, int columns = 80) {
         source.bounds = rowContentBounds(columns);
         table.setViewport(rows, source.bounds);
@@ -30,7 +30,7 @@ protected:
         source.pane().show(doubles::sectionOf(names));
         table.reloadData();
     }
-    /// The rows in the window, that of the cursor between brackets.
+    /// The rows in the window, with the cursor's in brackets.
     std::string window(std::size_t rows = 3) {
         std::string text;
         for (std::size_t shown = table.firstShown();
@@ -109,7 +109,7 @@ TEST_F(TerminalTableTest, EveryMoveAsksForDisplay) {
     table.reloadData();
     table.deselectRow(0, false);
     EXPECT_EQ(displays, 5);
-    show(2); // a drawing's own, which asks for no other
+    show(2); // a drawing does not request another
     EXPECT_EQ(displays, 5);
 }
 
@@ -181,7 +181,7 @@ TEST_F(TerminalTableTest, ALongRowScrollsAsFarAsItsContainer) {
     EXPECT_TRUE(table.scrollSideways(8));
     EXPECT_TRUE(table.scrollSideways(8));
     EXPECT_EQ(table.sidewaysOffset(), 16);
-    EXPECT_TRUE(table.scrollSideways(8)); // the content is both texts wider than the row
+    EXPECT_TRUE(table.scrollSideways(8)); // the content exceeds the row by the width of both texts
     EXPECT_EQ(table.sidewaysOffset(), 20);
     EXPECT_FALSE(table.scrollSideways(8));
     EXPECT_TRUE(table.scrollSideways(-8));
@@ -196,7 +196,7 @@ TEST_F(TerminalTableTest, AnotherRowOrAnotherWidthIsNotScrolled) {
     table.reloadData();
     table.scrollSideways(8);
     table.reloadData();
-    EXPECT_EQ(table.sidewaysOffset(), 8); // new data leaves it
+    EXPECT_EQ(table.sidewaysOffset(), 8); // new data keeps the offset
     table.moveCursor(1);
     EXPECT_EQ(table.sidewaysOffset(), 0);
     table.moveCursor(-1);
@@ -220,7 +220,7 @@ TEST_F(TerminalTableTest, AScrolledRowThatNewDataShortensScrollsFromWhereItIsSee
     source.show({doubles::leafNode("Name of 14 col", "123456")});
     table.reloadData();
     table.scrollSideways(20);
-    source.show({doubles::leafNode("Name of 14 col", "12")}); // scrolls by 16 columns, no more
+    source.show({doubles::leafNode("Name of 14 col", "12")}); // scrolls by 16 columns at most
     table.reloadData();
     EXPECT_FALSE(table.scrollSideways(8));
     EXPECT_TRUE(table.scrollSideways(-8));

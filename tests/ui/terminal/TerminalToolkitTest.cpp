@@ -144,7 +144,7 @@ TEST_F(TerminalToolkitTest, WhateverHappensToAScreenIsDrawn) {
     pane.view().setFrame({});
     pane.view().resignFirstResponder();
     EXPECT_EQ(displays, 7);
-    pane.didReceiveMemoryWarning(); // of these two nothing is seen
+    pane.didReceiveMemoryWarning(); // neither call has a visible effect
     pane.viewDidUnload();
     EXPECT_EQ(displays, 7);
 }

@@ -15,7 +15,7 @@
 
 namespace pallax::terminal {
 
-/// Rows of text as a table's source, laid out as the application lays out its own.
+/// Rows of text as a table's source, in the application's layout.
 class TextRows final : public ui::TableSource, public PaneOwner {
 public:
     /// Leaves of these names, each with the value "-".
@@ -23,7 +23,7 @@ public:
 
     void show(std::vector<NodeRef> rows) { _pane.show(doubles::treeNode("Rows", std::move(rows))); }
 
-    ui::Rect bounds; ///< that a cell gets
+    ui::Rect bounds; ///< given to each cell
 
     PaneModel& pane() override { return _pane; }
     std::size_t numberOfRows() const override { return _pane.totalRows(); }

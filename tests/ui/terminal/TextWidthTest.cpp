@@ -68,14 +68,14 @@ TEST(TextWidthTest, WhatCommandsATerminalIsEscaped) {
     EXPECT_EQ(joined(std::string_view("\0\x1b\x7f", 3)), "\\x00\\x1B\\x7F");
     EXPECT_EQ(joined("\u009b\u061c\u200e\u202e\u2069"), "\\u009B\\u061C\\u200E\\u202E\\u2069");
     EXPECT_EQ(columnsOf("\u202e"), 6);
-    EXPECT_EQ(joined("\x1b\u0301"), "\\x1B \u0301") << "it combines with no escape";
+    EXPECT_EQ(joined("\x1b\u0301"), "\\x1B \u0301") << "it does not combine with an escape";
 }
 
 TEST(TextWidthTest, BrokenUtf8IsReplacedByteByByte) {
     EXPECT_EQ(clustersOf("\xff"
                          "a"),
               (Clusters{{"\uFFFD", 1, 0, 1}, {"a", 1, 1, 1}}));
-    // A sequence cut short, an overlong one, and half a surrogate pair.
+    // An incomplete sequence, an overlong one, and half a surrogate pair.
     EXPECT_EQ(columnsOf("\xe6\xbc"), 2);
     EXPECT_EQ(columnsOf("\xc0\x80"), 2);
     EXPECT_EQ(columnsOf("\xed\xa0\x80"), 3);
