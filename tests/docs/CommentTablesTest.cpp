@@ -16,9 +16,9 @@
 #include <string>
 #include <vector>
 
-// The tables in the comments above the records, held against the layouts: least length, place,
-// width, key, and how a number is shown. What follows a semicolon, and how a computed value is
-// shown, is for readers alone.
+// Compares the tables in the records' comments with the layouts: least length, position, width,
+// key, and how a number is shown. Text after a semicolon and the display of computed values are not
+// compared.
 
 namespace pallax {
 namespace {
@@ -28,11 +28,11 @@ using doubles::replaced;
 using doubles::sourceFiles;
 using doubles::sourceText;
 
-/// What a comment or a layout says of one log code.
+/// The content of one log code in a comment or a layout.
 struct CodeTable {
     std::set<std::string> rows;   ///< "13.0+8 Version: number", "kHXCellMonitorMCC ARFCN: number"
-    std::set<std::string> places; ///< of lists and their counts: "15.0+8", "16 + 15i"
-    /// Keys of lists and computed values, which the rows have without place and text.
+    std::set<std::string> places; ///< positions of lists and their counts: "15.0+8", "16 + 15i"
+    /// Keys of lists and computed values; their rows have no position or text.
     std::set<std::string> bareKeys;
 };
 
@@ -147,7 +147,7 @@ std::string trimmed(const std::string& text) {
                                       : text.substr(first, text.find_last_not_of(' ') - first + 1);
 }
 
-/// The columns of the tables in a comment, as their latest heading has them.
+/// The columns of a comment's tables, according to the latest heading.
 class Columns {
 public:
     bool takeHeading(const std::string& line) {
@@ -165,7 +165,7 @@ public:
         return true;
     }
 
-    /// The cells of a row by their columns; none for a line that is no row.
+    /// The cells of a row by column; none for a line that is not a row.
     std::map<std::string, std::string> cellsOf(const std::string& line) const {
         std::map<std::string, std::string> cells;
         for (std::size_t column = 0; column < _starts.size(); ++column) {
@@ -187,7 +187,7 @@ private:
     std::vector<std::pair<std::size_t, std::string>> _starts;
 };
 
-/// Adds a row of a comment; `bareKeys` are the layout's.
+/// Adds a row of a comment; `bareKeys` come from the layout.
 void addRow(std::map<std::string, std::string> cells, const std::set<std::string>& bareKeys,
             CodeTable& table) {
     const std::string key = cells["key"] + cells["lookup name"];
@@ -212,7 +212,7 @@ void addRow(std::map<std::string, std::string> cells, const std::set<std::string
 
 using BareKeys = std::map<std::string, std::set<std::string>>;
 
-/// The tables of a header by their log codes ("0x7131"), with those of a header that they refer to.
+/// The tables of a header by log code ("0x7131"), including those of a header that they refer to.
 std::map<std::string, CodeTable> tablesIn(const std::string& path, const BareKeys& bareKeys) {
     std::map<std::string, CodeTable> tables;
     std::istringstream lines(sourceText(path));
@@ -269,7 +269,7 @@ const std::vector<std::string>& headers() {
     return all;
 }
 
-/// The one header in the folder, or among the common records, whose comment names the section.
+/// The header in the folder, or among the common records, whose comment names the section.
 std::string headerOf(std::string_view section, const std::string& folder) {
     std::vector<std::string> found;
     const std::string phrase = "section \"" + std::string(section) + "\"";

@@ -36,8 +36,7 @@ std::set<std::string> found(const std::string& document, const std::string& patt
 
 bool exists(const std::string& folder, const std::string& path) {
     const fs::path whole = fs::path(PALLAX_SOURCE_DIR) / folder / path;
-    return fs::exists(whole) ||
-           fs::exists(whole.string() + ".h"); // documents may name a class without ".h"
+    return fs::exists(whole) || fs::exists(whole.string() + ".h"); // may be named without ".h"
 }
 
 /// Calls `look` with the folder and text of each document.

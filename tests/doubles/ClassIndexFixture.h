@@ -23,8 +23,8 @@ protected:
     using Subscribers = decltype(WholeTechnology::subscribers);
     using Registrations = decltype(WholeTechnology::registration);
 
-    /// Each log code of the table has exactly its subscribers, and no other code has any: the index
-    /// wants no others, and `unwanted`, a code outside the table, has none.
+    /// Checks that each log code of the table has exactly its subscribers, that the index requests
+    /// no other codes, and that `unwanted`, a code outside the table, has no subscribers.
     void expectSubscribers(const Subscribers& table, LogCode unwanted) const {
         Names codes;
         for (const auto& [logCode, names] : table) {
@@ -41,7 +41,8 @@ protected:
             propertyListFile(std::string(PALLAX_SOURCE_DIR "/resources/") + file), _index);
     }
 
-    /// The records of a new index register in this order, each with a line of its number of codes.
+    /// Checks that the records of a new index register in this order, each with a line of its
+    /// number of codes.
     static void expectRegistration(const Registrations& records) {
         FakeStandardOutput output;
         const RecordingLog log;
@@ -58,7 +59,7 @@ protected:
         EXPECT_EQ(log.lines(), lines);
     }
 
-    /// The start command asks for exactly the modem's codes in the table.
+    /// Checks that the start command requests exactly the modem's codes in the table.
     static void expectStartCommand(const Subscribers& table,
                                    decltype(Technology::generator) makeGenerator,
                                    const std::string& templateName) {

@@ -13,7 +13,7 @@
 
 namespace pallax::doubles {
 
-/// A template with one row for each lookup name, called like it.
+/// A template with one row for each lookup name, with the same name.
 inline PropertyList flatTemplate() {
     Dictionary rows;
     for (const std::string& name : kLookupNames) {
@@ -22,10 +22,10 @@ inline PropertyList flatTemplate() {
     return rows;
 }
 
-/// What the start of a test says was shown before, under every name.
+/// The value of all rows at the start of a test.
 constexpr const char* kBefore = "what was shown before";
 
-/// A generator over the flat template, fed with stripped packets and read back.
+/// A generator with the flat template, which reads packets without prefix.
 class C2KFixture {
 public:
     C2KFixture() {
@@ -34,8 +34,8 @@ public:
         (void)_log.take();
     }
 
-    /// Feeds a packet without prefix. Kept are the lines that reading it logs, without the two that
-    /// the framing logs for every such packet.
+    /// Feeds a packet without prefix and keeps the lines that reading it logs, without the two
+    /// framing lines of every packet.
     void feed(const ByteBuffer& bytes) {
         generator.updateState(state, bytes);
         (void)generator.display(state);
@@ -47,13 +47,13 @@ public:
     }
     void feed(const Record& record) { feed(record.bytes()); }
 
-    /// Marks every row, so that one which is written can be told.
+    /// Marks all rows, to detect which are written.
     void mark() {
         for (const std::string& name : kLookupNames) {
             display()->set(name, kBefore);
         }
     }
-    /// The rows that a packet has written since they were marked, by name.
+    /// The rows written since they were marked, by name.
     Dictionary written() {
         Dictionary rows;
         for (const std::string& name : kLookupNames) {
@@ -64,7 +64,7 @@ public:
         }
         return rows;
     }
-    /// What a packet writes into the marked rows.
+    /// The marked rows that a packet writes.
     Dictionary writtenBy(const Record& record) {
         mark();
         feed(record);
@@ -75,7 +75,7 @@ public:
     const PropertyList& value(std::string_view name) { return *display()->find(name); }
     std::string text(std::string_view name) { return value(name).string().value_or("(no text)"); }
     DictionaryRef extraInfo() { return state.find("ExtraInfo")->dictionary(); }
-    /// An integer of the state; -1 without it.
+    /// An integer of the state, or -1.
     std::int64_t kept(std::string_view key) {
         const PropertyList* found = state.find(key);
         return found != nullptr ? found->integer().value_or(-1) : -1;
@@ -88,10 +88,10 @@ private:
 public:
     C2KLogGenerator generator{_fixture.environment()};
     Dictionary state;
-    std::vector<RecordingLog::Line> lines; ///< what reading the last packet logged
+    std::vector<RecordingLog::Line> lines; ///< logged by reading the last packet
 };
 
-/// "(name: value, name: value)": a list by pilot as the display tree shows it; "(no list)" where
+/// A list by pilot as the display tree shows it, "(name: value, name: value)", or "(no list)" if
 /// there is no branch.
 inline std::string shownList(const PropertyList& list) {
     PathDictionary paths;
@@ -108,8 +108,8 @@ inline std::string shownList(const PropertyList& list) {
     return "(" + text + ")";
 }
 
-/// Feeds a packet cut at every length to a fixture; below `minimum` it must write nothing.
-/// Each cut is a buffer of its own, so that a sanitizer sees a read outside.
+/// Feeds a packet cut at every length to a fixture; below `minimum` it must write nothing. Each cut
+/// is a separate buffer, so that a sanitizer detects a read outside.
 inline void cutPacketAtEveryLength(const Record& record, std::size_t minimum) {
     C2KFixture fixture;
     for (std::size_t length = 0; length < record.bytes().size(); ++length) {
@@ -124,8 +124,8 @@ inline void cutPacketAtEveryLength(const Record& record, std::size_t minimum) {
     }
 }
 
-/// Any bytes behind a header of that code, small ones in half of the cases; as many as one of
-/// `lengths` says (of the whole packet), or any up to the largest.
+/// A header of that code with random bytes, small ones in half of the cases. The length of the
+/// packet is one of `lengths`, or any up to the largest.
 inline Record anyPacket(LogCode code, const std::vector<std::size_t>& lengths) {
     constexpr unsigned kSmall = 5;
     constexpr unsigned kAny = 256;
@@ -138,7 +138,7 @@ inline Record anyPacket(LogCode code, const std::vector<std::size_t>& lengths) {
     return Record(code).append(Bytes(payload));
 }
 
-/// Holds that packets of any bytes under a code write no other rows; every text is made once.
+/// Checks that packets of random bytes write no other rows; formats every text once.
 inline void anyPacketWritesOnly(LogCode code, const std::vector<std::string>& names,
                                 const std::vector<std::size_t>& lengths) {
     EXPECT_TRUE(doubles::holds([&names, code, &lengths] {

@@ -17,7 +17,7 @@ using doubles::Record;
 using doubles::RecordingLog;
 using Lines = std::vector<RecordingLog::Line>;
 
-/// A packet of the EV-DO status on that channel (below 256), in device state Inactive.
+/// An EV-DO status packet on that channel (below 256), in device state Inactive.
 Record statusOn(unsigned channel) {
     return Record(0x1183).u8(channel).padTo(50);
 }
@@ -35,14 +35,14 @@ class C2KLogGeneratorTest : public testing::Test {
 protected:
     C2KLogGeneratorTest() { _fixture.resources.add("C2KTemplate", kTemplate); }
 
-    /// Feeds a message as the log channel delivers it.
+    /// Feeds a message from the log channel.
     void feed(const ByteBuffer& message) {
         RecordingLog log;
         _generator.updateState(_state, message);
         _lines = log.take();
     }
     PropertyList display() { return _generator.display(_state); }
-    /// What has been captured since the previous call.
+    /// The bytes captured since the previous call.
     ByteBuffer captured() {
         (void)_generator.generateLogUsingState(_state);
         return *_state.find("DisplayState")->data();
@@ -66,7 +66,7 @@ TEST_F(C2KLogGeneratorTest, TheStartCommandListsExactlyTheEightCodesInTheirOrder
 TEST_F(C2KLogGeneratorTest, TheFirstPacketMakesTheDisplayAndSetsBothPlacesOfAName) {
     feed(statusOn(25).prefixed());
     EXPECT_EQ(display(), displayOn("25"));
-    EXPECT_EQ(*_state.find("Template"), kTemplate) << "it stays as loaded";
+    EXPECT_EQ(*_state.find("Template"), kTemplate) << "it is unchanged";
     EXPECT_EQ(*_state.find("ExtraInfo"), PropertyList(Dictionary()));
     EXPECT_EQ(_state.find("Lookup")->dictionary()->find("kChannel")->array()->size(), 2U);
     EXPECT_EQ(_lines, (Lines{{4, "Processing the template"},
@@ -125,7 +125,7 @@ TEST_F(C2KLogGeneratorTest, TheLengthIsThatOfTheMessageBeforeThePrefixIsStripped
     EXPECT_EQ(_lines, (Lines{{6, "Log Header 0x81"},
                              {3, "Log code 0x1183 is 11 bytes long but should be 50 bytes."}}));
     message.erase(message.begin(), message.begin() + 2);
-    EXPECT_EQ(captured(), message) << "the eleven bytes behind the prefix";
+    EXPECT_EQ(captured(), message) << "the eleven bytes after the prefix";
     message = statusOn(25).prefixed();
     message.resize(12);
     feed(message);
@@ -184,7 +184,7 @@ TEST_F(C2KLogGeneratorTest, KnownPacketsAreCapturedBehindTheirPrefixInOrderAccep
     feed(accepted.bytes());
     expected.insert(expected.end(), accepted.bytes().begin(), accepted.bytes().end());
     EXPECT_EQ(captured(), expected);
-    EXPECT_EQ(captured(), ByteBuffer()) << "a tick hands it over";
+    EXPECT_EQ(captured(), ByteBuffer()) << "a tick moves it to the state";
 }
 
 TEST_F(C2KLogGeneratorTest, EveryCodeHasItsOwnParser) {
@@ -278,7 +278,7 @@ TEST_F(C2KWithoutTemplate, EveryCallTriesAgainAndNothingIsParsedIntoPlaces) {
     EXPECT_EQ(
         *_state.find("History"),
         PropertyList(Array{Dictionary{{"DisplayState", PropertyList::data(statusOn(25).bytes())}}}))
-        << "without a display an entry ends there";
+        << "without a display the entry ends there";
 }
 
 TEST_F(C2KWithoutTemplate, OneThatComesLaterIsUsed) {

@@ -7,7 +7,7 @@
 namespace pallax {
 namespace {
 
-/// A place as the table holds it.
+/// A place in the table.
 PropertyList place(const PropertyList& key, const PropertyList& dict) {
     return Dictionary{{"key", key}, {"dict", dict}};
 }

@@ -5,7 +5,7 @@
 
 #include <map>
 
-/// How a template becomes a display and its lookup table, and the template that is delivered.
+/// How a template becomes a display and its lookup table, and the installed template.
 namespace pallax {
 namespace {
 
@@ -46,7 +46,7 @@ TEST(C2KTemplate, ANameInTwoSectionsHasTwoPlaces) {
     expectInOrder(processed.display,
                   Dictionary{{"Serving", Dictionary{{"Channel", ""}, {"_sorted", "_sorted"}}},
                              {"Channel", ""}});
-    EXPECT_EQ(processed.lookup.size(), 1U) << "the mark is no lookup name";
+    EXPECT_EQ(processed.lookup.size(), 1U) << "the mark is not a lookup name";
     const auto places = processed.lookup.find("kChannel")->array();
     ASSERT_EQ(places->size(), 2U);
     EXPECT_EQ(places->at(0).dictionary()->find("dict")->dictionary(),
@@ -91,7 +91,7 @@ TEST(C2KTemplate, EmptySectionsAndDeepOnesStay) {
     EXPECT_EQ(processed.lines, (Lines{kProcessed, kProcessed, kProcessed, kProcessed}));
 }
 
-/// How often each lookup name stands in a template.
+/// Counts the occurrences of each lookup name in a template.
 void countNames(const PropertyList& object, std::map<std::string, int>& counts) {
     if (const DictionaryRef entries = object.dictionary()) {
         for (const Dictionary::Entry& entry : *entries) {
@@ -109,7 +109,7 @@ TEST(C2KTemplate, TheDeliveredOneShowsEveryLookupNameAndNoOther) {
     for (const std::string& name : kLookupNames) {
         EXPECT_GE(counts[name], 1) << name;
     }
-    EXPECT_EQ(counts.size(), kLookupNames.size()) << "what no layout fills would stay empty";
+    EXPECT_EQ(counts.size(), kLookupNames.size()) << "names that no layout fills would stay empty";
 }
 
 TEST(C2KTemplate, TheDeliveredOneGroupsItsRows) {

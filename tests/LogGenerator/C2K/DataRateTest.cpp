@@ -11,12 +11,12 @@ namespace {
 constexpr DataRateNames kNames = {"Seq", "Sent", "Seq1", "Sent1", "Seq2", "Sent2"};
 constexpr const char* kUnchanged = "what was shown before";
 
-/// The rate that is shown of one link, and what is kept of it.
+/// The shown rate of one link, and the values kept for it.
 class DataRateTest : public testing::Test {
 protected:
     DataRateTest() { _state.set("ExtraInfo", _extraInfo); }
 
-    /// The row behind a packet: "what was shown before" where the packet leaves it alone.
+    /// The row after a packet; "what was shown before" if the packet does not change it.
     std::string after(std::uint32_t sequence, std::int64_t sent) {
         _rate = dataRateSince(kNames, sequence, sent, _state);
         return _rate.isNull() ? kUnchanged : _rate.string().value_or("(no text)");
@@ -26,7 +26,7 @@ protected:
     }
     static PropertyList number(std::int64_t value) { return PropertyList::integer(value); }
 
-    PropertyList _rate; ///< null where the row stays as it is
+    PropertyList _rate; ///< null if the row does not change
     DictionaryRef _extraInfo = std::make_shared<Dictionary>();
     Dictionary _state;
 };
@@ -43,7 +43,7 @@ TEST_F(DataRateTest, TheNextShowsWhatWasSentOver1024TimesTheSequenceNumbers) {
     (void)after(7, 4096);
     EXPECT_EQ(after(8, 4096 + 2048), "2.00 kbps");
     EXPECT_EQ(after(12, 4096 + 2048 + 1024), "0.25 kbps");
-    EXPECT_EQ(after(13, 4096 + 2048 + 1024 + 128), "0.12 kbps") << "an even 0.125";
+    EXPECT_EQ(after(13, 4096 + 2048 + 1024 + 128), "0.12 kbps") << "0.125 is rounded to even";
     EXPECT_EQ(after(14, 4096 + 2048 + 1024 + 128), "0.00 kbps") << "nothing was sent";
     EXPECT_EQ(_rate.displayNumber()->unit(), "kbps");
 }
@@ -76,8 +76,8 @@ TEST_F(DataRateTest, TheDifferenceIsSigned32BitsWideAcrossTheWrap) {
     (void)after(0xFFFFFFFF, 0);
     EXPECT_EQ(after(0, 1024), "1.00 kbps");
     EXPECT_EQ(after(0xFFFFFFFF, 2048), kUnchanged) << "one step back";
-    EXPECT_EQ(after(0x7FFFFFFE, 2048 + 1024), "0.00 kbps") << "2^31 - 1 steps forth";
-    EXPECT_EQ(after(0xFFFFFFFE, 0), kUnchanged) << "2^31 steps are as many back";
+    EXPECT_EQ(after(0x7FFFFFFE, 2048 + 1024), "0.00 kbps") << "2^31 - 1 steps forward";
+    EXPECT_EQ(after(0xFFFFFFFE, 0), kUnchanged) << "2^31 steps count as backward";
     EXPECT_EQ(after(0x0000000D, 15 * 1024), "1.00 kbps");
 }
 

@@ -24,7 +24,7 @@ Record counters(std::uint32_t sequence, std::uint32_t value) {
     return record;
 }
 
-/// The total after a packet whose only byte that is not zero is the lowest of one counter.
+/// The total after a packet in which only the lowest byte of one counter is not zero.
 std::int64_t totalOf(std::size_t counter, unsigned value) {
     C2KFixture fixture;
     fixture.feed(counters(0, 0).at(kCounters + 4 * counter, value));

@@ -9,7 +9,7 @@ namespace {
 
 namespace any = doubles::any;
 
-/// The generator with the flat template, fed with the same packets as another.
+/// A generator with the flat template; two of them get the same packets.
 struct Twin {
     Twin() { fixture.resources.add("C2KTemplate", doubles::flatTemplate()); }
 
@@ -20,7 +20,7 @@ struct Twin {
     Dictionary state;
 };
 
-/// A packet of any of the codes, which its layout mostly accepts.
+/// A packet of a random code, which its layout usually accepts.
 ByteBuffer anyPacketOfAnyCode() {
     switch (any::between(0, 8)) {
     case 0: {

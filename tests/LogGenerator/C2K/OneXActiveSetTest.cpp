@@ -4,13 +4,13 @@
 
 #include <gtest/gtest.h>
 
-/// The list of the active set in the packet of the 1x status.
+/// The list of the active set in the 1x status packet.
 namespace pallax {
 namespace {
 
 using namespace doubles; // NOLINT: the vocabulary of these tests
 
-/// The list as shown after a packet whose active set stands last and is cut at `length`.
+/// The shown list after a packet that ends with the active set and is cut at `length`.
 std::string listAfter(const Record& packet, std::size_t length) {
     C2KFixture fixture;
     ByteBuffer bytes = packet.bytes();
@@ -28,7 +28,7 @@ std::string listOf(const Subpacket& activeSet) {
     return listAfter(packetWith(activeSet), SIZE_MAX);
 }
 
-/// One pilot of PN 4 and size 0 with that energy.
+/// The level of one pilot with PN 4 and that energy, in a list of size 0.
 std::string levelOf(unsigned divisor, unsigned gain, unsigned exponent, unsigned energy) {
     return listOf(
         Subpacket(3).u16(divisor).u8(gain).u8(exponent).u8(1).u8(0).u16(0xFFFF).u16(4).putU16(
@@ -86,7 +86,7 @@ TEST(OneXActiveSet, TheSizeOfAPilotGivesItsStrideAndTheOffsetOfItsEnergy) {
         for (std::size_t pilot = 0; pilot < 3; ++pilot) {
             activeSet.putU16(pilot * each.stride + 12, 900 + static_cast<unsigned>(pilot));
         }
-        // The energy of a pilot of size 0 lies where the PN of the next one does.
+        // The energy of a pilot of size 0 has the place of the next pilot's PN.
         activeSet.putU16(2 * each.stride + each.energy, 6000);
         const std::string list = listOf(activeSet);
         const std::string last = "902: -5.09 dB)";
@@ -97,9 +97,9 @@ TEST(OneXActiveSet, TheSizeOfAPilotGivesItsStrideAndTheOffsetOfItsEnergy) {
 }
 
 TEST(OneXActiveSet, TheListStopsAtTheFirstPilotThatIsNotWhole) {
-    // It says it is so short that the walk finds it in the shortest packet, too.
+    // It claims to be so short that it is found in the shortest packet, too.
     const Record packet = packetWith(twoPilots().claim(12));
-    const std::size_t end = packet.bytes().size(); // behind the energy of the second pilot
+    const std::size_t end = packet.bytes().size(); // the end of the second pilot's energy
     const std::size_t start = end - 50;
     EXPECT_EQ(listAfter(packet, end), "(4: -14.79 dB, 168: (ref pilot) -5.09 dB)");
     for (std::size_t length = start + 30; length < end; ++length) {
@@ -112,7 +112,8 @@ TEST(OneXActiveSet, TheListStopsAtTheFirstPilotThatIsNotWhole) {
 }
 
 TEST(OneXActiveSet, APilotMayLieBehindItsSubpacket) {
-    // The active set says it ends where its first pilot starts: that lies in what follows.
+    // The active set claims to end where its first pilot starts, so the pilot is in the next
+    // subpacket.
     const Record packet = packetOf(0x119C, {systemState(kTrafficState), radio(), noFingers(),
                                             Subpacket(3).u16(64).u8(1).u8(2).u8(1).u8(0).u16(4),
                                             Subpacket(4).padTo(14)});

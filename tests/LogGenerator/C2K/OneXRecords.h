@@ -15,7 +15,7 @@ inline Subpacket radio() {
     return Subpacket(2).u8(0).u8(1).u16(283).u16(25).s8(-40).s8(40).s16(-125);
 }
 
-/// An active set without pilots; N, g and e of the formula.
+/// An active set without pilots, with N, g and e of the formula.
 inline Subpacket noPilots(unsigned divisor = 64, unsigned gain = 1, unsigned exponent = 2) {
     return Subpacket(3).u16(divisor).u8(gain).u8(exponent).u8(0).u8(0).u16(0);
 }
@@ -42,7 +42,7 @@ inline Subpacket noFingers() {
     return Subpacket(4);
 }
 
-/// 0x119C in that state with that active set.
+/// 0x119C with that state and that active set.
 inline Record oneXStatus(unsigned state, const Subpacket& activeSet = noPilots()) {
     return packetOf(0x119C, {systemState(state), radio(), activeSet, noFingers()});
 }

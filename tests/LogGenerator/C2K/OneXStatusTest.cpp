@@ -169,7 +169,7 @@ TEST(OneXStatus, CutAtEveryLengthItWritesNothingBeforeTheLastSubpacketsId) {
 
 TEST(OneXStatus, FieldsPastThePacketsEndReadAsZero) {
     C2KFixture fixture;
-    // The radio subpacket is the last one and says it is longer than the packet.
+    // The radio subpacket is the last one and claims to be longer than the packet.
     const Record packet = packetOf(0x119C, {noFingers(), noPilots(), systemState(kTrafficState),
                                             Subpacket(2).u8(1).claim(14)});
     fixture.feed(packet);
@@ -186,7 +186,7 @@ TEST(OneXStatus, OutsideTrafficTheRateOfTheCallIsShownAsOldOnceAndForgotten) {
     fixture.feed(trafficFrame(0));
     EXPECT_EQ(fixture.text("k1xTrafficFER"), "1.54%");
     fixture.feed(oneXStatus(kTrafficState));
-    EXPECT_EQ(fixture.text("k1xTrafficFER"), "1.54%") << "still the call";
+    EXPECT_EQ(fixture.text("k1xTrafficFER"), "1.54%") << "the call still lasts";
     fixture.feed(oneXStatus(6));
     EXPECT_EQ(fixture.text("k1xTrafficFER"), "1.54% (old)");
     EXPECT_EQ(fixture.value("k1xTrafficFER").displayNumber()->unit(), "%");
@@ -201,7 +201,7 @@ TEST(OneXStatus, WithoutAnyRateNoneIsShownAsOld) {
     EXPECT_FALSE(fixture.writtenBy(oneXStatus(6)).contains("k1xTrafficFER"));
     fixture.state.set("TrafficFER", "no number");
     EXPECT_FALSE(fixture.writtenBy(oneXStatus(6)).contains("k1xTrafficFER"));
-    EXPECT_TRUE(fixture.state.contains("TrafficFER")) << "what is no rate stays";
+    EXPECT_TRUE(fixture.state.contains("TrafficFER")) << "a value that is not a rate stays";
     fixture.state.set("TrafficFER", PropertyList::integer(1));
     fixture.feed(oneXStatus(6));
     EXPECT_EQ(fixture.text("k1xTrafficFER"), "100.00% (old)");

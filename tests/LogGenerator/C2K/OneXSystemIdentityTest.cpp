@@ -66,7 +66,7 @@ TEST(OneXSystemIdentity, EveryRoamingIndicatorHasItsLabel) {
     EXPECT_EQ(label(13), "ERI - 13");
     EXPECT_EQ(label(256), "ERI - 256") << "all 32 bits count";
     EXPECT_EQ(label(0x7FFFFFFF), "ERI - 2147483647");
-    EXPECT_EQ(label(0x80000000), "ERI - -2147483648") << "taken unsigned, shown signed";
+    EXPECT_EQ(label(0x80000000), "ERI - -2147483648") << "looked up unsigned, shown signed";
     EXPECT_EQ(label(0xFFFFFFFF), "ERI - -1");
     EXPECT_EQ(fixture.value("k1xRoamingHome").displayNumber()->integer(), -1);
 }
@@ -81,12 +81,13 @@ TEST(OneXSystemIdentity, ASystemTypeOtherThan2IsShownInPlaceOfSystemAndNetwork) 
     EXPECT_EQ(shown(2, 0), "4139");
     EXPECT_EQ(shown(0, 0), "(unknown system type 0)");
     EXPECT_EQ(fixture.text("kNetworkId"), "(unknown system type 0)");
-    EXPECT_EQ(fixture.value("kSystemId").displayNumber(), nullptr) << "it is no system's number";
+    EXPECT_EQ(fixture.value("kSystemId").displayNumber(), nullptr)
+        << "it is not the number of a system";
     EXPECT_EQ(shown(3, 0), "(unknown system type 3)");
     EXPECT_EQ(shown(2, 1), "(unknown system type 16777218)");
     EXPECT_EQ(shown(2, 0x80), "(unknown system type -2147483646)");
     EXPECT_EQ(fixture.text("kNetworkId"), "(unknown system type -2147483646)");
-    EXPECT_EQ(fixture.text("kPacketZoneId"), "7") << "the rest is shown all the same";
+    EXPECT_EQ(fixture.text("kPacketZoneId"), "7") << "the rest is still shown";
 }
 
 TEST(OneXSystemIdentity, NumbersAreUnsigned) {

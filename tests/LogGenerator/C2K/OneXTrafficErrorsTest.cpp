@@ -121,7 +121,7 @@ TEST(OneXTrafficErrors, AFrameByteThatThePacketEndsBeforeIsNoError) {
     C2KFixture fixture;
     fixture.feed(packetOf(0x119D, {Subpacket(11).padTo(24).claim(25)}));
     EXPECT_EQ(fixture.text("k1xTrafficFER"), "0.00%");
-    cutPacketAtEveryLength(trafficFrame(1), 22); // behind the id
+    cutPacketAtEveryLength(trafficFrame(1), 22); // after the id
 }
 
 TEST(OneXTrafficErrors, InACutPacketTheFrameCountsWhereverTheWalkFindsIt) {
@@ -135,7 +135,7 @@ TEST(OneXTrafficErrors, InACutPacketTheFrameCountsWhereverTheWalkFindsIt) {
     EXPECT_EQ(shown(21), "") << "its id is cut off";
     EXPECT_EQ(shown(22), "0.00%");
     EXPECT_EQ(shown(23), "0.00%") << "its size reads 0";
-    EXPECT_EQ(shown(24), "") << "its end at 46 lies at the bound or beyond";
+    EXPECT_EQ(shown(24), "") << "its end at 46 is not below the bound";
     EXPECT_EQ(shown(29), "");
     EXPECT_EQ(shown(30), "0.00%");
     EXPECT_EQ(shown(45), "0.00%") << "the byte itself is cut off";

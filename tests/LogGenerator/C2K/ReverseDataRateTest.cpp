@@ -17,7 +17,7 @@ constexpr std::size_t kLength = 1750;
 constexpr auto kWeights = std::to_array<std::int64_t>(
     {128, 256, 512, 768, 1024, 1536, 2048, 3072, 4096, 6144, 8192, 12288});
 
-/// Where the counters of a rate stand.
+/// The places of a rate's counters.
 std::vector<std::size_t> countersOf(std::size_t rate) {
     std::vector<std::size_t> offsets;
     for (std::size_t block = 0; block < 3; ++block) {

@@ -188,7 +188,7 @@ TEST_F(GSMLogGeneratorTest, AfterAFailureTheStateIsAsItWasBeforeTheMessage) {
     EXPECT_EQ(PropertyList(state).description(), before);
     EXPECT_EQ(value("Display").dictionary(), display);
     feed(xmlMessage(Dictionary{{"A", "x"}}));
-    EXPECT_EQ(value("Display"), PropertyList(Dictionary{{"A", "x"}})) << "and it goes on";
+    EXPECT_EQ(value("Display"), PropertyList(Dictionary{{"A", "x"}})) << "later messages are shown";
 }
 
 TEST_F(GSMLogGeneratorTest, TheDisplayTickUpdatesTheHistoryAndReturnsTheDisplay) {
@@ -246,7 +246,7 @@ TEST_F(GSMLogGeneratorTest, WithoutAHistoryTheSaveContentsAreEmpty) {
     EXPECT_EQ(generator->getSaveContentsFromState(state), PropertyList(Array{}));
 }
 
-/// `depth` containers inside one another, each holding two entries, the innermost two strings.
+/// `depth` nested containers of two entries each; the innermost contains two strings.
 PropertyList nested(std::size_t depth, bool arrays) {
     PropertyList inner = "x";
     for (; depth > 0; --depth) {
@@ -335,7 +335,7 @@ TEST(GSMLogGeneratorProperty, AnyBytesAreDisplayedOrLeaveTheStateAsItWas) {
         const PropertyList object = anyMessage();
         const std::array forms = {xmlMessage(object), binaryMessage(object), textMessage(object)};
         ByteBuffer message = forms.at(doubles::any::index(forms.size()));
-        // A message with a byte changed, or cut.
+        // Changes a byte of the message, or cuts it.
         const auto at = doubles::any::index(message.size());
         if (doubles::any::boolean()) {
             message[at] = doubles::any::byte();
@@ -346,7 +346,7 @@ TEST(GSMLogGeneratorProperty, AnyBytesAreDisplayedOrLeaveTheStateAsItWas) {
             RC_CLASSIFY(true, "refused");
             RC_ASSERT(PropertyList(stream.state).description() == before);
         } else {
-            // As texts: a number that is none equals nothing, not even itself.
+            // Compares texts, because NaN does not equal itself.
             const PropertyList shown = GSMLogGenerator::processObject(stream.value("DisplayState"));
             RC_ASSERT(stream.value("Display").description() == shown.description());
         }
@@ -368,7 +368,7 @@ TEST_F(GSMLogGeneratorTest, AMessageThatIsRefusedLeavesTheDisplayToCome) {
     EXPECT_EQ(value("Display"), PropertyList(kExampleDisplay));
     feed(xmlMessage(Dictionary{{"Cell", Dictionary{{"ARFCN", "11"}}}}));
     feed(bytesOf("\"no service\""));
-    EXPECT_EQ(value("Display"), PropertyList("no service")) << "and not the dictionary before it";
+    EXPECT_EQ(value("Display"), PropertyList("no service")) << "not the dictionary before it";
 }
 
 } // namespace

@@ -26,8 +26,8 @@ inline ByteBuffer textMessage(const PropertyList& object) {
     return bytesOf(doubles::textForm(object));
 }
 
-/// Any object of strings and dictionaries, and with `withArrays` of arrays. Small containers
-/// are frequent, for they are what collapses.
+/// A random object of strings, dictionaries and, with `withArrays`, arrays. Small containers are
+/// frequent, because only they collapse.
 inline PropertyList anyObject(int depth, bool withArrays = true) {
     constexpr int kMostEntries = 4;
     static const std::string kLetters = [] {
@@ -57,7 +57,7 @@ inline PropertyList anyObject(int depth, bool withArrays = true) {
     return entries;
 }
 
-/// The same with the top level a dictionary, as the modem sends it.
+/// The same with a dictionary at the top, as the modem sends it.
 inline PropertyList anyMessage(bool withArrays = true) {
     constexpr int kDepth = 4;
     Dictionary entries;

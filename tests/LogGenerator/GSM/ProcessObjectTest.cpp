@@ -15,13 +15,13 @@ PropertyList processed(const PropertyList& object) {
     return GSMLogGenerator::processObject(object);
 }
 
-/// The display form is `expected`, dictionaries in that very order.
+/// Checks that the display form is `expected`, with dictionaries in the same order.
 void expectForm(const PropertyList& object, const PropertyList& expected) {
     EXPECT_EQ(processed(object).description(), expected.description());
     EXPECT_EQ(processed(object), expected);
 }
 
-/// What(), line and message of the failure; "none" without one.
+/// The message of the failure, after checks of its place; "none" without one.
 std::string failureOf(const PropertyList& object) {
     try {
         (void)processed(object);
@@ -40,7 +40,7 @@ bool isOneEntryDictionary(const PropertyList& object) {
     return entries != nullptr && entries->size() == 1;
 }
 
-/// True when a dictionary of one entry stands anywhere below the top.
+/// True when a level below the top has a dictionary of one entry.
 bool holdsOneEntryDictionary(const PropertyList& object) {
     const auto isOrHolds = [](const PropertyList& value) {
         return isOneEntryDictionary(value) || holdsOneEntryDictionary(value);
