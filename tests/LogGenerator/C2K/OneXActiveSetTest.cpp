@@ -28,7 +28,7 @@ std::string listOf(const Subpacket& activeSet) {
     return listAfter(packetWith(activeSet), SIZE_MAX);
 }
 
-/// The level of one pilot with PN 4 and that energy, in a list of size 0.
+/// The level of one pilot of PN 4 and size 0 with that energy.
 std::string levelOf(unsigned divisor, unsigned gain, unsigned exponent, unsigned energy) {
     return listOf(
         Subpacket(3).u16(divisor).u8(gain).u8(exponent).u8(1).u8(0).u16(0xFFFF).u16(4).putU16(

@@ -81,8 +81,7 @@ TEST(OneXSystemIdentity, ASystemTypeOtherThan2IsShownInPlaceOfSystemAndNetwork) 
     EXPECT_EQ(shown(2, 0), "4139");
     EXPECT_EQ(shown(0, 0), "(unknown system type 0)");
     EXPECT_EQ(fixture.text("kNetworkId"), "(unknown system type 0)");
-    EXPECT_EQ(fixture.value("kSystemId").displayNumber(), nullptr)
-        << "it is not the number of a system";
+    EXPECT_EQ(fixture.value("kSystemId").displayNumber(), nullptr) << "not a system's number";
     EXPECT_EQ(shown(3, 0), "(unknown system type 3)");
     EXPECT_EQ(shown(2, 1), "(unknown system type 16777218)");
     EXPECT_EQ(shown(2, 0x80), "(unknown system type -2147483646)");
