@@ -88,7 +88,7 @@ public:
                 addObjectKey(key);
             }
             if (isObjectStream && section.objectKeys.empty()) {
-                // The section is the value itself, or a list of values that are their own identity.
+                // The section is the value itself, or a list of values that identify themselves.
                 addObjectKey({.name = "", .isIdentifying = section.isList});
             }
         }

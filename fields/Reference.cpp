@@ -105,7 +105,7 @@ std::optional<CodeDescription> shownIn(const Places& places, const CodeDescripti
     return any ? std::optional(std::move(shown)) : std::nullopt;
 }
 
-/// What a section tells, as a sentence: the template names sections only.
+/// The sentence for a section of the template, which contains only section names.
 std::string_view cdmaSectionMeaning(std::string_view section) {
     static constexpr auto kMeanings = std::to_array<std::pair<std::string_view, std::string_view>>({
         {"System Identity", "Which 1x system serves the phone."},
@@ -120,7 +120,7 @@ std::string_view cdmaSectionMeaning(std::string_view section) {
     return found != kMeanings.end() ? found->second : std::string_view();
 }
 
-/// A section for each dictionary of the template that shows a lookup name.
+/// Appends a section for each dictionary of the template that shows a lookup name.
 void appendPlaces(const Dictionary& entries, const std::string& name, const std::string& path,
                   const std::vector<CodeDescription>& codes,
                   std::vector<SectionReference>& sections) {

@@ -15,7 +15,7 @@ struct RecordedTechnology;
 struct ObjectKey {
     std::string name;
     std::string_view meaning{}; ///< a sentence
-    bool isIdentifying = false; ///< it says which cell an entry is
+    bool isIdentifying = false; ///< part of the entry's identity
 };
 
 /// One section of a technology's display and its log codes.
@@ -48,7 +48,7 @@ std::vector<TechnologyReference> gatherReference(const Resources& resources);
 TechnologyReference gatherReference(const RecordedTechnology& technology,
                                     const Resources& resources);
 
-/// The codes of a technology that a section reads, ascending, each once.
+/// The codes that the technology's sections read, ascending, without duplicates.
 std::vector<LogCode> codesOf(const TechnologyReference& technology);
 
 } // namespace pallax

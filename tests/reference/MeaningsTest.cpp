@@ -7,7 +7,7 @@ namespace {
 
 using doubles::Keys;
 
-/// Every key that is described, and each section itself as the empty key.
+/// All described keys, and each section itself as the empty key.
 Keys describedKeys(const TechnologyReference& technology) {
     Keys keys = doubles::shownKeys(technology);
     for (auto& [section, hidden] : doubles::hiddenKeys(technology)) {
