@@ -176,7 +176,7 @@ TEST_F(ZORLogGenerator2Test, LogType2IsDropped) {
     EXPECT_EQ(display(), kEmptyDisplay);
 }
 
-TEST_F(ZORLogGenerator2Test, ACodeNobodyWantsChangesNothing) {
+TEST_F(ZORLogGenerator2Test, ACodeWithoutSubscribersChangesNothing) {
     feed(Record(0x4117).bytes());
     EXPECT_EQ(display(), kEmptyDisplay);
 }
@@ -232,7 +232,7 @@ TEST_F(ZORLogGenerator2Test, KeptRecordsAreReadWhenTheDisplayIsAskedFor) {
     EXPECT_EQ(_generator.display(_state), kShownOfTheLatest);
 }
 
-TEST_F(ZORLogGenerator2Test, ARecordThatThrowsDoesSoAtOnceAndTheKeptOnesAreShown) {
+TEST_F(ZORLogGenerator2Test, ARecordThatThrowsIsReadAtOnceAndTheKeptOnesAreShown) {
     _generator.updateState(_state, Record(0x4116).padTo(40).bytes());
     EXPECT_THROW(_generator.updateState(_state, Record(0x4116).u8(0xEE).bytes()),
                  ArrayOutOfBoundsException);

@@ -143,7 +143,7 @@ TEST_F(BrowsingSessionTest, SaysFromWhenTheValuesAreThatARestartedLinkLeavesBehi
     EXPECT_EQ(rootPane().totalRows(), 0U);
 }
 
-TEST_F(BrowsingSessionTest, StartsAfreshByItselfWhereThatIsWanted) {
+TEST_F(BrowsingSessionTest, StartsAfreshByItselfIfTheSettingSaysSo) {
     open({.name = "live modem"}, true);
     session->start();
     queue.runReady();

@@ -61,7 +61,7 @@ TEST(DateFormatter, EveryFieldHasAtLeastAsManyDigitsAsLetters) {
     EXPECT_EQ(written("yyyyy MMM ddd HHH mmm sss", 1041429906), "02003 001 001 014 005 006");
 }
 
-TEST(DateFormatter, WhatStandsBetweenApostrophesIsItself) {
+TEST(DateFormatter, TextBetweenApostrophesIsCopied) {
     EXPECT_EQ(written("'My days' d 'Hms'", 0), "My days 1 Hms");
     EXPECT_EQ(written("", 0), "");
     EXPECT_EQ(written("'", 0), "");

@@ -151,7 +151,7 @@ TEST_F(PallaxAppUpdateTest, WhileDisconnectedTheTopPaneShowsConnectingWithDots) 
     EXPECT_EQ(app->updateMessage(), "Updated 2023-11-14 at 22:13:22") << "not touched";
 }
 
-TEST_F(PallaxAppUpdateTest, WhileDisconnectedPanesAreReloadedAndPoppedAllTheSame) {
+TEST_F(PallaxAppUpdateTest, PanesAreReloadedAndPoppedWhileDisconnected) {
     browseThreeLevels();
     ports.deliver({1});
     queue.runReady();

@@ -72,7 +72,7 @@ TEST_F(PallaxPaneControllerTest, WithoutTheSavePermissionTheToolbarEndsWithTheSp
     EXPECT_TRUE(std::holds_alternative<ui::FlexibleSpace>(pane->toolbarItems()[2]));
 }
 
-TEST_F(PallaxPaneControllerTest, TheSavePermissionIsLookedAtEachTimeTheToolbarIsBuilt) {
+TEST_F(PallaxPaneControllerTest, TheSavePermissionIsCheckedEachTimeTheToolbarIsBuilt) {
     const PaneRef pane = makePane(nullptr);
     pane->createToolbarItems();
     application.saveAllowed = true;
@@ -241,7 +241,7 @@ TEST_F(PallaxPaneControllerTest, AReusedCellOfTheSameKindShowsTheOtherNode) {
     EXPECT_EQ(second->value()->text, "2");
 }
 
-TEST_F(PallaxPaneControllerTest, ANewCellGetsTheTablesContentAreaWhateverItsAccessory) {
+TEST_F(PallaxPaneControllerTest, ANewCellGetsTheTablesContentAreaWithAnyAccessory) {
     const PaneRef pane = shownPane();
     tableOf(*pane).bounds = {{0, 0}, {500, 44}};
     for (const std::size_t row : {0U, 1U}) {

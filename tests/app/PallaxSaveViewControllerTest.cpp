@@ -194,7 +194,7 @@ TEST_F(PallaxSaveViewControllerTest, SaveWritesTimestampDataAndDescriptionInThis
     EXPECT_EQ(toolkit.alerts.size(), 0U);
 }
 
-TEST_F(PallaxSaveViewControllerTest, TheTimestampIsUTCWhateverTheZone) {
+TEST_F(PallaxSaveViewControllerTest, TheTimestampIsUTCInAnyZone) {
     clock.setZone({2h, true});
     const auto made = open(two);
     made->savePressed();
@@ -310,7 +310,7 @@ TEST_F(PallaxSaveViewControllerTest, TheScreenIsClosedOnTheQueueAfterTheSave) {
     EXPECT_EQ(closes, 1);
 }
 
-TEST_F(PallaxSaveViewControllerTest, AFailedWriteIsLoggedAndAlertedAndTheScreenClosesAllTheSame) {
+TEST_F(PallaxSaveViewControllerTest, AFailedWriteIsLoggedAndAlertedAndTheScreenCloses) {
     files.failWrite = true;
     const auto made = open(two);
     toolkit.take();

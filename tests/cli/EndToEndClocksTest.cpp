@@ -236,7 +236,7 @@ TEST_F(EndToEndLiveClock, AClockThatWasSetBackFreezesNoDisplayAndItsDatesAreTheP
     end(viewer);
 }
 
-TEST_F(EndToEndLiveClock, AClosedPortIsNoticedWhateverTheStampsAre) {
+TEST_F(EndToEndLiveClock, AClosedPortIsNoticedWithAnyStamps) {
     PallaxProcess viewer(world, {"--log-level", "3"});
     ASSERT_TRUE(aClientStreams());
     send(seconds(3600), 0);

@@ -95,7 +95,7 @@ TEST_F(EndToEndExit, OfUnreadableSettingsIsOneSentence) {
     EXPECT_EQ(run({brief(), "--print", "--speed", "max"}).status, 0) << "it may be missing";
 }
 
-TEST_F(EndToEndExit, OfAPrintedTreeThatNobodyReadsSwitchesThePreferenceOff) {
+TEST_F(EndToEndExit, OfAPrintedTreeWithoutAReaderSwitchesThePreferenceOff) {
     const std::string pipe = world.path("pipe");
     ASSERT_EQ(::mkfifo(pipe.c_str(), S_IRUSR | S_IWUSR), 0);
     Descriptor reader(::open(pipe.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));

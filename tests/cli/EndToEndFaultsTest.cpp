@@ -142,7 +142,7 @@ protected:
     }
 };
 
-TEST_F(EndToEndFaults, AServiceKilledBeforeTheConnectionLeavesASocketThatNobodyAnswers) {
+TEST_F(EndToEndFaults, AServiceKilledBeforeTheConnectionLeavesAStaleSocket) {
     meets(Fault::KilledBeforeTheConnection, {"Could not create HXServerConnection"});
 }
 

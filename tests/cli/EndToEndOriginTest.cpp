@@ -83,7 +83,7 @@ TEST_F(EndToEndOrigin, AfterAReconnectOldValuesAreToldAndRStartsAfresh) {
     expectNothingLeft();
 }
 
-TEST_F(EndToEndOrigin, WhereTheSettingSaysSoItStartsAfreshByItself) {
+TEST_F(EndToEndOrigin, WithTheSettingItStartsAfreshByItself) {
     std::ofstream(world.path("config/pallax/pallax.conf"), std::ios::app)
         << "after-reconnect = fresh\n";
     PallaxTerminal terminal(world, {}, {});

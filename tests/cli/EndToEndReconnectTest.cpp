@@ -121,7 +121,7 @@ TEST_F(EndToEndReconnect, AfterAKilledServiceTheViewerTriesAgain5SecondsLaterAnd
     end(again);
 }
 
-TEST_F(EndToEndReconnect, WhereTheSettingSaysSoTheDisplayStartsAfreshAfterAReconnect) {
+TEST_F(EndToEndReconnect, WithTheSettingTheDisplayStartsAfreshAfterAReconnect) {
     std::filesystem::create_directories(world.path("config/pallax"));
     std::ofstream(world.path("config/pallax/pallax.conf")) << "after-reconnect = fresh\n";
     PallaxProcess service(world, serviceOf("first.pcap", 2));

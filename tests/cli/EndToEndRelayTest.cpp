@@ -129,7 +129,7 @@ TEST_F(EndToEndRelay, WhoComesLaterGetsWhatComesLater) {
     EXPECT_EQ(service->wait(), 0);
 }
 
-TEST_F(EndToEndRelay, AClientThatTakesNothingKeepsNobodyWaitingNotEvenTheEnd) {
+TEST_F(EndToEndRelay, AStoppedClientDelaysNeitherOtherClientsNorTheEnd) {
     constexpr int kPackets = 40'000; // each takes 50 bytes or more on the wire: more than may wait
     const std::string file = world.path("living.pcapng");
     PallaxProcess stopped(world, {"record", world.path("stopped.pcapng")});

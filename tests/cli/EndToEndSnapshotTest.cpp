@@ -64,7 +64,7 @@ TEST_F(EndToEndSnapshot, TwoSavesAtTheEndOfARecordingAreTwoFilesNamedAfterThePre
     }
 }
 
-TEST_F(EndToEndSnapshot, ATextThatXmlCannotHoldIsSavedAllTheSame) {
+TEST_F(EndToEndSnapshot, ATextThatXmlCannotRepresentIsSaved) {
     constexpr int kIfxLinkType = 147;
     const auto picture = serializeBinary(Dictionary{
         {"Cell", Dictionary{{"Name", "a\x1b[31mb"}, {"State", "Idle"}}}, {"Second", "1"}});
@@ -89,7 +89,7 @@ TEST_F(EndToEndSnapshot, ATextThatXmlCannotHoldIsSavedAllTheSame) {
         << contentOf(world.path("log"));
 }
 
-TEST_F(EndToEndSnapshot, OfALiveStreamTheDatesAreThePresentWhateverItsStampsAre) {
+TEST_F(EndToEndSnapshot, OfALiveStreamHasPresentDatesWithAnyStamps) {
     const std::time_t began = std::time(nullptr);
     const std::string pipe = world.path("device");
     ASSERT_EQ(::mkfifo(pipe.c_str(), 0600), 0);

@@ -149,7 +149,7 @@ TEST_F(EndToEndTerminal, ADumbTerminalGetsThePrintedTree) {
     EXPECT_EQ(terminal.bytes().find('\x1b'), std::string::npos);
 }
 
-TEST_F(EndToEndTerminal, ATerminalTypeThatNobodyKnowsGivesOneSentence) {
+TEST_F(EndToEndTerminal, AnUnknownTerminalTypeGivesOneSentence) {
     PallaxTerminal terminal(world, {brief()}, {.type = "no-such-terminal"});
     EXPECT_TRUE(terminal.shows("pallax: The terminal type \"no-such-terminal\" (TERM) is unknown; "
                                "--print needs no\n terminal.\n"));

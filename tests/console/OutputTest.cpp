@@ -43,7 +43,7 @@ TEST(Output, AFullDiskIsNamed) {
     ::close(full);
 }
 
-TEST(Output, APipeThatNobodyReadsIsClosed) {
+TEST(Output, APipeWithoutAReaderIsClosed) {
     ::signal(SIGPIPE, SIG_IGN);
     int pipe[2] = {};
     ASSERT_EQ(::pipe(pipe), 0);
@@ -58,7 +58,7 @@ TEST(Output, APipeThatNobodyReadsIsClosed) {
     ::close(pipe[1]);
 }
 
-TEST(Output, WhatNobodyTakesIsGivenUpOnceASignalAsksForTheEnd) {
+TEST(Output, ABlockedWriteIsGivenUpAfterATerminationSignal) {
     using std::chrono::milliseconds;
     const Interruption interruption({nullptr, nullptr}, {milliseconds(20), milliseconds(1000)});
     AsioMainQueue queue;

@@ -60,7 +60,7 @@ TEST(ProgressPace, QuickPiecesLookAtTheClockRarely) {
     EXPECT_LE(clock.looks, kPieces / 64 + 10);
 }
 
-TEST(ProgressPace, SlowPiecesAfterQuickOnesAreEachLookedAtAgain) {
+TEST(ProgressPace, SlowPiecesAfterQuickOnesAreEachCheckedAgain) {
     CountedClock clock;
     ProgressPace pace(clock);
     for (unsigned count = 0; count < 1000; ++count) {

@@ -120,7 +120,7 @@ TEST_F(DecodeCommandTest, EveryModeGeneratesTheDisplayAtTheTicksOfTheRecording) 
     }
 }
 
-TEST_F(DecodeCommandTest, WhereStampsStepBackTicksAreCountedAnewAndTheirNumbersGoOn) {
+TEST_F(DecodeCommandTest, AtAStepBackTheTickGridRestartsAndTheTickNumbersContinue) {
     options.every = Every::Tick;
     add("a.pcap", {{seconds(0), "A=1"},
                    {seconds(3), "A=2"},
@@ -289,7 +289,7 @@ TEST_F(DecodeCommandTest, WhatARecordingGivesThatIsWaitedForIsWrittenAtOnceAndAF
     EXPECT_EQ(blocks, (std::vector<std::string>{first + second, first, second}));
 }
 
-TEST_F(DecodeCommandTest, ATemplateThatCannotBeLoadedIsNoFaultOfItsPacket) {
+TEST_F(DecodeCommandTest, ATemplateThatCannotBeLoadedIsNotAFatalRecord) {
     add("a.pcap", {{milliseconds(0), "A=1"}});
     add("b.pcap", {{milliseconds(0), "?the template is gone"}});
     try {

@@ -91,7 +91,7 @@ TEST_F(FieldsCommandTest, ALineHasWhatAPersonLooksFor) {
               "ifx.network.name - text - - Name of the network. /Network/Name");
 }
 
-TEST_F(FieldsCommandTest, AFieldThatIsNotShownSaysSoAndNeedsNoMeaning) {
+TEST_F(FieldsCommandTest, AFieldThatIsNotShownIsMarkedAndNeedsNoMeaning) {
     EXPECT_EQ(lineOf("gsm.umts_rr_info"),
               "gsm.umts_rr_info - number -32768..32767 hidden /UMTS RR Info/*");
     EXPECT_TRUE(lineOf("utran.gsm_neighbor_cell_list.ncc")

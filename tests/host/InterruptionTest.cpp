@@ -82,7 +82,7 @@ protected:
     Descriptor writer;
 };
 
-TEST_F(InterruptionTest, AWriteThatNobodyTakesIsGivenUpAndTheQueueHearsOfTheSignal) {
+TEST_F(InterruptionTest, ABlockedWriteIsGivenUpAndTheQueueHandlesTheSignal) {
     for (const int number : {SIGINT, SIGTERM, SIGHUP}) {
         const Interruption interruption(kNoTerminal, kShort);
         AsioMainQueue queue;
@@ -116,7 +116,7 @@ TEST_F(InterruptionTest, BeforeItIsDueNothingIsInterrupted) {
     queue.run();
 }
 
-TEST_F(InterruptionTest, AnAlarmOfSomebodyElseEndsTheProgramAsWithoutIt) {
+TEST_F(InterruptionTest, AForeignAlarmEndsTheProgramAsWithoutIt) {
     EXPECT_EQ(signalAfter([] {
                   const Interruption interruption(kNoTerminal, kLong);
                   (void)std::raise(SIGALRM);

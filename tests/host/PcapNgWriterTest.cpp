@@ -95,7 +95,7 @@ TEST_F(PcapNgWriterTest, IsReadBackToTheNanosecondWhileItIsBeingWritten) {
     EXPECT_EQ((*recording)->next()->data.size(), 1U);
 }
 
-TEST_F(PcapNgWriterTest, WhateverIsWrittenIsReadBack) {
+TEST_F(PcapNgWriterTest, AnyPacketsAreReadBack) {
     EXPECT_TRUE(doubles::holds([this] {
         const std::vector<ByteBuffer> packets = doubles::any::buffers();
         const auto writer = create(Existing::Overwrite);
@@ -296,7 +296,7 @@ TEST_F(PcapNgWriterToAStalledPipe, EndsQuietlyBehindAWholePacket) {
     EXPECT_TRUE(errorOfPackets(100).readerHasGone);
 }
 
-TEST_F(PcapNgWriterToAStalledPipe, TellsOfAPacketThatWasTakenInPart) {
+TEST_F(PcapNgWriterToAStalledPipe, ReportsAPartlyWrittenPacket) {
     const HostError error = errorOfPackets(10'000);
     EXPECT_FALSE(error.readerHasGone);
     EXPECT_EQ(error.sentence, "The recording standard output ends in the middle of a packet "

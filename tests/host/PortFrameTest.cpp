@@ -153,7 +153,7 @@ TEST(PortFrame, AfterAFaultNothingIsTaken) {
     EXPECT_EQ(parser.take(), std::nullopt);
 }
 
-TEST(PortFrame, WhateverIsFramedIsParsedAgain) {
+TEST(PortFrame, AnyFramesAreParsedAgain) {
     EXPECT_TRUE(doubles::holds([] {
         const std::vector<ByteBuffer> messages = doubles::any::buffers();
         const auto identifier = static_cast<std::int32_t>(doubles::any::bits());

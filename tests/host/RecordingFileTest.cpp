@@ -33,7 +33,7 @@ TEST_F(RecordingFileTest, WhatCanBeReadOnlyOnceIsAStream) {
     EXPECT_FALSE(RecordingFile::isStream(folder.path("missing")));
 }
 
-TEST_F(RecordingFileTest, AStreamThatNobodyWritesToIsToldAndWaitedFor) {
+TEST_F(RecordingFileTest, AStreamWithoutAWriterIsReportedAndWaitedFor) {
     const Descriptor writer(::open(pipe.c_str(), O_RDWR | O_CLOEXEC));
     std::vector<std::string> told;
     const auto waiting = [&](std::string_view sentence) {
@@ -49,7 +49,7 @@ TEST_F(RecordingFileTest, AStreamThatNobodyWritesToIsToldAndWaitedFor) {
         << "the reader waits for more data";
 }
 
-TEST_F(RecordingFileTest, NothingIsToldOfWhatIsThere) {
+TEST_F(RecordingFileTest, AvailableDataIsNotReported) {
     const Descriptor writer(::open(pipe.c_str(), O_RDWR | O_CLOEXEC));
     EXPECT_EQ(::write(writer.number(), "x", 1), 1);
     const auto waiting = [](std::string_view sentence) { ADD_FAILURE() << sentence; };

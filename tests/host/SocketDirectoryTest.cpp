@@ -111,7 +111,7 @@ TEST_F(SocketDirectoryTest, ALockThatAnotherKeepsIsWaitedForOnlyForAWhile) {
     EXPECT_TRUE(directory->lock());
 }
 
-TEST_F(SocketDirectoryTest, OnlySocketsThatNobodyListensOnAreRemoved) {
+TEST_F(SocketDirectoryTest, OnlySocketsWithoutAListenerAreRemoved) {
     const auto directory = SocketDirectory::open();
     ASSERT_TRUE(directory);
     const Descriptor living = listenAt(*directory->socketPath("living"));

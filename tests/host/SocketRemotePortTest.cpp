@@ -44,7 +44,7 @@ std::optional<ByteBuffer> echo(std::int32_t /*identifier*/, Bytes data) {
     return ByteBuffer(data.begin(), data.end());
 }
 
-TEST_F(SocketRemotePortTest, ANameThatNobodyListensOnGivesNoPort) {
+TEST_F(SocketRemotePortTest, ANameWithoutAListenerGivesNoPort) {
     EXPECT_EQ(_ports.createRemote("nobody"), nullptr);
     EXPECT_EQ(_ports.createRemote(std::string(200, 'a')), nullptr);
 }
@@ -244,7 +244,7 @@ TEST_F(SocketRemotePortTest, InvalidateCallsBackBeforeItReturns) {
     EXPECT_EQ(calls, 1);
 }
 
-TEST_F(SocketRemotePortTest, TheCallbackMayDestroyThePortAndADestroyedPortCallsNobody) {
+TEST_F(SocketRemotePortTest, TheCallbackMayDestroyThePortAndADestroyedPortCallsNothing) {
     serve(echo);
     _remote->setInvalidationCallback([&](MessagePort&) { _remote.reset(); });
     auto other = _ports.createRemote("a.port");

@@ -322,7 +322,7 @@ TEST_F(SourceClockTest, TheLatestPacketThatThereCanBeIsFollowedByATick) {
     EXPECT_EQ(_ticks.size(), 1U);
 }
 
-TEST(SourceClockProperty, TheSamePacketsGiveTheSameTicksWhateverClockFramesComeBetween) {
+TEST(SourceClockProperty, TheSamePacketsGiveTheSameTicksWithAnyClockFramesBetween) {
     // A tick "sees" the packets before it; a tick without new packets shows nothing.
     const auto seenBy = [](const std::vector<std::int64_t>& packets, bool withClockFrames) {
         doubles::ManualClock wall;

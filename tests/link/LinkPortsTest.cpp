@@ -86,7 +86,7 @@ TEST_F(LinkPortsTest, WhereTheFixedNameIsTakenTheNextViewerHasANameOfItsOwn) {
     EXPECT_EQ(ports.replies().size(), 1U);
 }
 
-TEST_F(LinkPortsTest, EachStartChoosesAnew) {
+TEST_F(LinkPortsTest, EachStartChoosesItsName) {
     _crowd.taken = {kFixedName};
     _model->startMonitor();
     _crowd.taken = {};

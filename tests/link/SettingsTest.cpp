@@ -102,7 +102,7 @@ TEST_F(SettingsFileTest, AMebibyteIsTheMost) {
     EXPECT_EQ(settings.error().sentence, file + " cannot be read: it has more than 1048576 bytes.");
 }
 
-TEST_F(SettingsFileTest, WhatCannotBeLookedAtIsNotMissing) {
+TEST_F(SettingsFileTest, AFileThatCannotBeCheckedIsNotMissing) {
     const std::string circle = folder.path("circle");
     std::filesystem::create_symlink(circle, circle);
     const std::string file = folder.write("file", "");

@@ -34,7 +34,7 @@ TEST_F(WaitNoticeTest, SaysOnceAfterASecondWhatIsWaitedFor) {
     EXPECT_EQ(_said.size(), 1U);
 }
 
-TEST_F(WaitNoticeTest, SaysItAnewWhenThatIsSomethingElse) {
+TEST_F(WaitNoticeTest, RepeatsTheNoticeWhenTheReasonChanges) {
     _queue.advance(2s);
     _obstacle = "Busy";
     _queue.advance(250ms);

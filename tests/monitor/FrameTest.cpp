@@ -80,7 +80,7 @@ TEST_F(FrameTest, AValueThatChangesIsMarkedWithTheBranchesAboveIt) {
     EXPECT_EQ(age("/A"), 4);
 }
 
-TEST_F(FrameTest, AValueIsItsTextWhateverHoldsIt) {
+TEST_F(FrameTest, ValuesAreComparedByTheirTexts) {
     static constexpr NumberFormat kDbm{"%d dBm"};
     show(Dictionary{{"A", DisplayNumber(std::int64_t{-90}, kDbm)}}, 0);
     show(Dictionary{{"A", "-90 dBm"}}, 2);
@@ -89,7 +89,7 @@ TEST_F(FrameTest, AValueIsItsTextWhateverHoldsIt) {
     EXPECT_EQ(frame->changed(), Paths{"/A"});
 }
 
-TEST_F(FrameTest, WhatIsNewIsChangedAndWhatHasGoneIsToldWithoutWhatStoodBelow) {
+TEST_F(FrameTest, NewNodesAreChangedAndVanishedOnesAreListedWithoutThoseBelow) {
     show(Dictionary{{"A", Dictionary{{"B", "1"}, {"C", "2"}}}, {"D", "3"}}, 0);
     show(Dictionary{{"E", Dictionary{{"F", "4"}}}, {"D", "3"}}, 2);
     EXPECT_EQ(frame->changed(), Paths{"/E/F"});

@@ -120,7 +120,7 @@ TEST_F(ModemLinkTest, ItTicksEvery2SecondsWhetherPacketsArriveOrNot) {
     EXPECT_EQ(ticks, 2);
 }
 
-TEST_F(ModemLinkTest, AModemThatHasGoneIsFoundAtTheTickAndTheLinkStartsAnew) {
+TEST_F(ModemLinkTest, AModemThatHasGoneIsFoundAtTheTickAndTheLinkRestarts) {
     link->startMonitor();
     ports.endRemote();
     queue.advance(2s);

@@ -96,7 +96,7 @@ TEST_F(PallaxModelLifecycleTest, ARefreshWithoutPortsChecksNothing) {
     EXPECT_EQ(linkDiary, Diary{});
 }
 
-TEST_F(PallaxModelLifecycleTest, ARefreshRestartsFirstAndThenTellsOfNewData) {
+TEST_F(PallaxModelLifecycleTest, ARefreshRestartsFirstAndThenReportsNewData) {
     start();
     model->updateWithData({});
     ports.endRemote();

@@ -56,7 +56,7 @@ private:
     std::vector<std::pair<std::string, std::string>> _entries;
 };
 
-TEST(DictionaryProperty, WhateverIsDoneToItItHoldsWhatAPlainListWould) {
+TEST(DictionaryProperty, AfterAnyOperationsItEqualsAPlainList) {
     EXPECT_TRUE(doubles::holds([] {
         Dictionary dictionary;
         Model model;

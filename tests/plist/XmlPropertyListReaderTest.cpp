@@ -139,7 +139,7 @@ TEST(XmlPropertyListReader, ReadsReals) {
               "at byte 0: a real beyond the range of a double");
 }
 
-TEST(XmlPropertyListReader, ReadsDataStrictlyButForWhiteSpace) {
+TEST(XmlPropertyListReader, ReadsDataStrictlyExceptWhiteSpace) {
     EXPECT_EQ(readValue("<data/>"), PropertyList::data({}));
     EXPECT_EQ(readValue("<data> A A\n= =\t</data>"), PropertyList::data({0}));
     for (const char* text : {"A", "AA", "AAA", "AA=", "A===", "=AAA",

@@ -114,7 +114,7 @@ private:
     std::size_t _compared = 0;
 };
 
-TEST(Consistency, TheServingGsmCellIsTheSameInEveryRecordThatTellsOfIt) {
+TEST(Consistency, TheServingGsmCellIsTheSameInEveryRecord) {
     SameIdentity cell("GSM Serving Cell", {"ARFCN", "Cell ID"});
     SameIdentity network("Serving PLMN", {"Mobile Country Code", "Location Area Code"});
     inEveryDrive({"gsm", seconds(60), kRate}, [&](const DriveMoment& moment) {
@@ -125,7 +125,7 @@ TEST(Consistency, TheServingGsmCellIsTheSameInEveryRecordThatTellsOfIt) {
     EXPECT_GT(network.compared(), PALLAX_DRIVES);
 }
 
-TEST(Consistency, TheServingUtranCellIsTheSameInEveryRecordThatTellsOfIt) {
+TEST(Consistency, TheServingUtranCellIsTheSameInEveryRecord) {
     SameIdentity cell("Serving Cell Info", {"Cell ID", "Downlink UARFCN", "Uplink UARFCN"});
     inEveryDrive({"utran", seconds(60), kRate},
                  [&](const DriveMoment& moment) { cell.see(moment); });

@@ -203,7 +203,7 @@ TEST_F(PatientRelayTest, TheStreamWaitsForTheFirstSourceToBegin) {
     EXPECT_EQ(take(*second), (std::vector<int>{3}));
 }
 
-TEST_F(PatientRelayTest, WithoutASourceTheStreamIsTakenAllTheSameWhenTheTimeIsOver) {
+TEST_F(PatientRelayTest, WithoutASourceTheStreamIsReadWhenTheTimeIsOver) {
     _tap->give({1, 2});
     _tap->end();
     _queue.advance(20s - 1ns);

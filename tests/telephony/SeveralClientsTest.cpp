@@ -103,7 +103,7 @@ TEST_F(SeveralClientsTest, EachGetsTheCodesOfItsOwnStartCommand) {
     EXPECT_EQ(std::count(first->codes.begin(), first->codes.end(), 2), 0);
 }
 
-TEST_F(SeveralClientsTest, ADeadClientDelaysNobodyAndItsPacketsAreDroppedCountedAndLogged) {
+TEST_F(SeveralClientsTest, ADeadClientDelaysNoOtherAndItsPacketsAreDroppedCountedAndLogged) {
     start(2, TelephonyServer::kMostWaiting);
     auto dead = open("dead", false);
     const auto living = open("living", true);

@@ -5,7 +5,7 @@
 namespace pallax {
 namespace {
 
-TEST(GrowingText, HoldsWhatWasPutWhateverItsRoom) {
+TEST(GrowingText, HoldsItsTextWithAnyInitialRoom) {
     for (const std::size_t room : {0U, 1U, 5U, 100U}) {
         GrowingText text(room);
         EXPECT_EQ(text.view(), "");

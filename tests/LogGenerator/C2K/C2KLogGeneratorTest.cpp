@@ -295,7 +295,7 @@ TEST_F(C2KWithoutTemplate, OneWhoseRootIsNoDictionaryCannotBeLoaded) {
     EXPECT_FALSE(_state.contains("Template"));
 }
 
-TEST_F(C2KWithoutTemplate, RunningValuesAreKeptAllTheSame) {
+TEST_F(C2KWithoutTemplate, RunningValuesAreStillKept) {
     _generator.updateState(_state, Record(0x1192).u32(7).padTo(241).prefixed());
     EXPECT_EQ(*_state.find("FLDataSeqNum"), PropertyList::integer(7));
 }
@@ -324,7 +324,7 @@ TEST(Technologies, TheCDMAIdentifierGivesTheCDMAGeneratorAndIsComparedBetweenGSM
     EXPECT_EQ((found + 1)->identifier, kHXLogChannelTechnology_Zorell_LTE);
 }
 
-TEST_F(C2KLogGeneratorTest, OfPacketsThatReplaceEachOtherTheLatestIsShownWhenSomebodyLooks) {
+TEST_F(C2KLogGeneratorTest, OfPacketsThatReplaceEachOtherTheLatestIsShown) {
     _generator.updateState(_state, statusOn(25).bytes());
     _generator.updateState(_state, statusOn(26).bytes());
     EXPECT_EQ(*_state.find("Display"), displayOn(""));

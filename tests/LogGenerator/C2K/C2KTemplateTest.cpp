@@ -55,7 +55,7 @@ TEST(C2KTemplate, ANameInTwoSectionsHasTwoPlaces) {
     EXPECT_EQ(processed.lines, (Lines{kProcessed, kProcessed})) << "one for each dictionary";
 }
 
-TEST(C2KTemplate, TheMarkIsCopiedUnderWhateverKeyItStands) {
+TEST(C2KTemplate, TheMarkIsCopiedUnderAnyKey) {
     const Processed processed = process({{"Any", "_sorted"}, {"_sorted", "kChannel"}});
     expectInOrder(processed.display, Dictionary{{"Any", "_sorted"}, {"_sorted", ""}});
     EXPECT_EQ(processed.lookup.size(), 1U);

@@ -106,7 +106,7 @@ TEST_F(DataRateTest, IfEitherKeptValueIsMissingTheRateIsEmpty) {
     }
 }
 
-TEST_F(DataRateTest, WithoutExtraInformationTheRateIsShownAllTheSame) {
+TEST_F(DataRateTest, TheRateIsShownWithoutExtraInformation) {
     _state.remove("ExtraInfo");
     (void)after(7, 4096);
     EXPECT_EQ(after(8, 5120), "1.00 kbps");

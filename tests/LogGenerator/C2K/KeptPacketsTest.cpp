@@ -46,7 +46,7 @@ ByteBuffer anyPacketOfAnyCode() {
     }
 }
 
-TEST(KeptPackets, ShowTheSameHoweverSeldomSomebodyLooks) {
+TEST(KeptPackets, ShowTheSameHoweverRarelyTheDisplayIsRead) {
     EXPECT_TRUE(doubles::holds([] {
         Twin often;
         Twin seldom;

@@ -65,7 +65,7 @@ protected:
     LookupDisplay display{kCodes};
 };
 
-TEST_F(LookupDisplayTest, OfPacketsThatMayWaitTheLatestIsReadWhenTheDisplayIsLookedAt) {
+TEST_F(LookupDisplayTest, OfPacketsThatMayWaitTheLatestIsReadWhenTheDisplayIsNeeded) {
     take(0, Record(1).u8(5).u8(0));
     take(0, Record(1).u8(6).u8(0));
     EXPECT_TRUE(shown->empty());
@@ -83,7 +83,7 @@ TEST_F(LookupDisplayTest, APacketThatKeepsRunningValuesIsReadAtOnce) {
     EXPECT_EQ(*state.find("Packets"), PropertyList::integer(2));
 }
 
-TEST_F(LookupDisplayTest, WithoutALookupTableRunningValuesAreKeptAllTheSame) {
+TEST_F(LookupDisplayTest, RunningValuesAreKeptWithoutALookupTable) {
     lookup = nullptr;
     take(0, Record(1).u8(5).u8(1).u8(4).u8(9));
     take(1, Record(2));

@@ -60,7 +60,7 @@ TEST(SimInfo, ShowsFourteenFilesEachUnderItsLabelInTheDisplaysOrder) {
     expectInOrder(sectionAfter<SimInfo>(allFiles()), expected);
 }
 
-TEST(SimInfo, ValuesAreStoredAsTheyComeWhateverTheirType) {
+TEST(SimInfo, ValuesOfAnyTypeAreStoredUnchanged) {
     const auto number = PropertyList::integer(6);
     const auto bytes = PropertyList::data({0x89, 0x10});
     const PropertyList list = Array{"310260", "310410"};
@@ -175,7 +175,7 @@ TEST(SimInfo, AnyBytesKeepWithinItsKeysAndRaiseItsExceptionOnly) {
     anyBytesKeepWithin<SimInfo, UnknownDataException>(keys);
 }
 
-TEST(SimInfo, WhateverTheServiceSendsForAFileIsShownUnderItsKey) {
+TEST(SimInfo, AnyValueOfAFileIsShownUnderItsKey) {
     std::vector<std::string> files;
     for (const auto& row : kFilesToKeys) {
         files.emplace_back(row.first);

@@ -353,7 +353,7 @@ TEST(GSMLogGeneratorProperty, AnyBytesAreDisplayedOrLeaveTheStateAsItWas) {
     }));
 }
 
-TEST_F(GSMLogGeneratorTest, TheDisplayOfADictionaryIsMadeWhenSomebodyLooks) {
+TEST_F(GSMLogGeneratorTest, TheDisplayOfADictionaryIsMadeWhenItIsNeeded) {
     feed(xmlMessage(Dictionary{{"Cell", Dictionary{{"ARFCN", "11"}}}}));
     feed(xmlMessage(kExample));
     EXPECT_TRUE(state.find("Display")->dictionary()->empty());

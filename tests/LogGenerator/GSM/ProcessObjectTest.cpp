@@ -88,7 +88,7 @@ TEST(ProcessObject, AnEmptyDictionaryIsKept) {
                Dictionary{{"Cell", Dictionary{}}, {"List", Array{Dictionary{}}}});
 }
 
-TEST(ProcessObject, TheInnerKeyOfAOneEntryDictionaryIsDroppedWhateverItsValue) {
+TEST(ProcessObject, TheInnerKeyOfAOneEntryDictionaryIsDroppedForAnyValue) {
     expectForm(Dictionary{{"K", Dictionary{{"A", Array{"header", "x"}}}}, {"L", "1"}},
                Dictionary{{"K", Array{"x"}}, {"L", "1"}});
     expectForm(Dictionary{{"K", Dictionary{{"A", Dictionary{}}}}, {"L", "1"}},

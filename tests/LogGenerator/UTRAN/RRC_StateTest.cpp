@@ -36,7 +36,7 @@ TEST(RRC_State, EveryModeHasItsLabel) {
     }
 }
 
-TEST(RRC_State, AForeignVersionShowsUnknownAndLogsMode255WhateverTheModeByteHolds) {
+TEST(RRC_State, AForeignVersionShowsUnknownAndLogsMode255ForAnyModeByte) {
     RecordFixture<RRC_State> fixture;
     for (const unsigned version : {0U, 2U, 255U}) {
         for (const unsigned mode : {0U, 3U, 6U}) {
@@ -72,7 +72,7 @@ TEST(RRC_State, WithoutASectionTheLineHasNoDictionary) {
               (Lines{{4, "RRC Info"}, {4, "Display Dict = (null), rrc mode = 0 Disconnected"}}));
 }
 
-TEST(RRC_State, AShortPacketIsLoggedAndReadAllTheSameWithItsMissingBytesZero) {
+TEST(RRC_State, AShortPacketIsLoggedAndReadWithItsMissingBytesZero) {
     RecordFixture<RRC_State> fixture;
     fixture.feed(Record(0xD0E0).u8(1)); // the version, but no mode
     EXPECT_EQ(fixture.lines,

@@ -9,7 +9,7 @@ TEST(DetectedSet, SubscribesToTheCellListIgnoresShortAndUnknownPacketsAndIsEmpti
     doubles::expectSearcherSet<DetectedSet>("Detected Set", "DetectedSet");
 }
 
-TEST(DetectedSet, IsAlwaysEmptiedWhateverTheCells) {
+TEST(DetectedSet, IsEmptiedByAnyCells) {
     doubles::expectAlwaysEmptied<DetectedSet>();
 }
 

@@ -9,7 +9,7 @@ TEST(MonitoredSet, SubscribesToTheCellListIgnoresShortAndUnknownPacketsAndIsEmpt
     doubles::expectSearcherSet<MonitoredSet>("Monitored Set", "MonitoredSet");
 }
 
-TEST(MonitoredSet, IsAlwaysEmptiedWhateverTheCells) {
+TEST(MonitoredSet, IsEmptiedByAnyCells) {
     doubles::expectAlwaysEmptied<MonitoredSet>();
 }
 

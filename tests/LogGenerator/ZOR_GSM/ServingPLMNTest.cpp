@@ -155,7 +155,7 @@ TEST(ServingPLMN, ACellWithoutTheNetworkCodeLogsItAndStillSetsTheLocationArea) {
               (Lines{{4, "Serving PLMN"}, {3, "ServingPLMN: Failed to retrieve MNC\n"}}));
 }
 
-TEST(ServingPLMN, EveryMissingOrUnreadableNumberIsLoggedAndLaterCellsAreNotLookedAt) {
+TEST(ServingPLMN, EveryMissingOrUnreadableNumberIsLoggedAndLaterCellsAreIgnored) {
     RecordFixture<ServingPLMN> fixture;
     const PropertyList unreadable = cell("GSM", "Serving", {{"MNC", 2147483648LL}});
     unreadable.dictionary()->set("kHXCellMonitorMCC", "310");

@@ -79,7 +79,7 @@ TEST(UMTSSetCellMonitor, RSCPIsIn_dB_From0x4005AndIn_dBm_FromTheCellMonitor) {
     EXPECT_EQ(monitored.displayNumber()->unit(), "dBm");
 }
 
-TEST(UMTSSetCellMonitor, EveryMissingNumberIsLoggedAndLeftOutAndTheCellIsShownAllTheSame) {
+TEST(UMTSSetCellMonitor, EveryMissingNumberIsLoggedAndLeftOutOfTheShownCell) {
     const auto without = [](const char* key) {
         const PropertyList partial = neighbour(10713, 388, -95, -7);
         partial.dictionary()->remove(key);

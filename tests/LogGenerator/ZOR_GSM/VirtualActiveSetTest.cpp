@@ -9,7 +9,7 @@ TEST(VirtualActiveSet, SubscribesToTheCellListIgnoresShortAndUnknownPacketsAndIs
     doubles::expectSearcherSet<VirtualActiveSet>("Virtual Active Set", "VirtualActiveSet");
 }
 
-TEST(VirtualActiveSet, IsAlwaysEmptiedWhateverTheCells) {
+TEST(VirtualActiveSet, IsEmptiedByAnyCells) {
     doubles::expectAlwaysEmptied<VirtualActiveSet>();
 }
 

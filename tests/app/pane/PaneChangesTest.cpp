@@ -107,7 +107,7 @@ std::vector<std::pair<std::string, std::string>> anyLeaves() {
     return unique;
 }
 
-TEST(PaneChangesTest, WhateverRowsComeGoAndMoveALeafIsComparedWithTheOneOfItsName) {
+TEST(PaneChangesTest, ALeafIsComparedWithTheOneOfItsNameWhenRowsComeGoAndMove) {
     const auto nodes = [](const auto& leaves) {
         std::vector<NodeRef> made;
         for (const auto& [name, value] : leaves) {

@@ -140,7 +140,7 @@ TEST_F(PaneModelTest, TheCursorComesBackToItsRowWhenNoRowPassedTheFilter) {
     EXPECT_EQ(shown(), "A B C [D] E");
 }
 
-TEST_F(PaneModelTest, AFilterKeepsRowsByNameOrValueWhateverTheCase) {
+TEST_F(PaneModelTest, AFilterKeepsRowsByNameOrValueInAnyCase) {
     pane.show(treeNode("Section", {leafNode("Measured RSRP", dbm(-94)), leafNode("Version", "1"),
                                    leafNode("Kind", "Average rsrp"), treeNode("Cells", {})}));
     pane.setFilter("RsRp");

@@ -30,7 +30,7 @@ std::string inOrder(const std::vector<NodeRef>& children, PaneOrder order) {
     return shown(pane);
 }
 
-TEST(PaneOrderTest, RowsStandAsTheDisplayHasThemAtFirstAndBackwardsWhereThatIsWanted) {
+TEST(PaneOrderTest, RowsAreInTheDisplaysOrderAtFirstAndInReverseIfDescending) {
     const std::vector<NodeRef> rows{leafNode("B", "1"), leafNode("A", "2"), leafNode("C", "0")};
     EXPECT_EQ(inOrder(rows, {}), "B A C");
     EXPECT_EQ(inOrder(rows, {By::Display, true}), "C A B");

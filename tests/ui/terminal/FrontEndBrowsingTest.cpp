@@ -113,7 +113,7 @@ TEST_F(FrontEndBrowsingTest, OpeningALeafDoesNothing) {
     EXPECT_EQ(stage.depth(), 1U);
 }
 
-TEST_F(FrontEndBrowsingTest, OnAPaneWithoutRowsNoKeyHasAnythingToDo) {
+TEST_F(FrontEndBrowsingTest, OnAPaneWithoutRowsKeysHaveNoEffect) {
     stage.press(Key::Down, 2);
     stage.press(Key::Enter); // the empty list
     ASSERT_EQ(stage.depth(), 2U);
@@ -159,7 +159,7 @@ TEST_F(FrontEndBrowsingTest, BackspaceGoesBackFromAScrolledRowAtOnce) {
     EXPECT_EQ(stage.depth(), 1U);
 }
 
-TEST_F(FrontEndBrowsingTest, YCopiesTheValueAndSaysSoUntilTheNextKey) {
+TEST_F(FrontEndBrowsingTest, YCopiesTheValueAndShowsAMessageUntilTheNextKey) {
     stage.press(Key::End);
     stage.frontEnd.resize(80, 12);
     stage.type("y");
@@ -200,7 +200,7 @@ TEST_F(FrontEndBrowsingTest, SOpensTheSaveScreen) {
     EXPECT_NE(stage.saveScreen(), nullptr);
 }
 
-TEST_F(FrontEndBrowsingTest, WhereSavingIsNotOfferedSSaysSo) {
+TEST_F(FrontEndBrowsingTest, WithoutTheSaveButtonSShowsAMessage) {
     stage.savingAllowed = false;
     stage.tick(display());
     stage.frontEnd.resize(60, 12);

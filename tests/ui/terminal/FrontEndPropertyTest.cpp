@@ -36,7 +36,7 @@ std::vector<std::uint8_t> anyScript() {
     return script;
 }
 
-TEST(FrontEndPropertyTest, WhateverHappensTheScreenIsWholeAndTheCursorOnARow) {
+TEST(FrontEndPropertyTest, AfterAnyEventsTheScreenIsWholeAndTheCursorOnARow) {
     EXPECT_TRUE(doubles::holds([] {
         const std::vector<std::uint8_t> script = anyScript();
         RC_ASSERT(StageScript(script).play() == "");

@@ -179,7 +179,7 @@ std::string anyText() {
     return text;
 }
 
-TEST(GridTest, WhateverIsPutWhereverEveryRowFillsItsColumns) {
+TEST(GridTest, EveryRowFillsItsColumnsAfterAnyPut) {
     EXPECT_TRUE(doubles::holds([] {
         Grid grid(any::between(0, 12), any::between(0, 3));
         const int puts = any::between(1, 40);

@@ -210,7 +210,7 @@ bool isBoundary(const std::string& text, std::size_t offset) {
                        [offset](const Cluster& cluster) { return cluster.offset == offset; });
 }
 
-TEST_F(LineEditorTest, WhateverIsPressedTheTextIsUtf8AndTheCursorBetweenTwoCharacters) {
+TEST_F(LineEditorTest, AfterAnyKeysTheTextIsUtf8AndTheCursorBetweenTwoCharacters) {
     const auto characters = std::to_array<char32_t>(
         {U'a', U' ', U'é', U'漢', U'\u0301', U'\u200d', U'😀', 0x85, controlKey('a'),
          controlKey('b'), controlKey('d'), controlKey('f'), controlKey('h'), controlKey('k'),

@@ -100,7 +100,7 @@ TEST_F(TerminalRestorerTest, RestoresTheTerminalAtEveryDeadlySignalAndDiesOfIt) 
     }
 }
 
-TEST_F(TerminalRestorerTest, RestoresTheTerminalAtASignalThatAsksForTheEndWhereNobodyHearsIt) {
+TEST_F(TerminalRestorerTest, RestoresTheTerminalAtATerminationSignalWithoutAHandler) {
     for (const int signal : {SIGINT, SIGTERM, SIGHUP, SIGQUIT}) {
         EXPECT_EQ(signalAfter([&] {
                       const TerminalRestorer restorer(terminal);

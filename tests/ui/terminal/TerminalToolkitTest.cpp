@@ -69,7 +69,7 @@ TEST_F(TerminalToolkitTest, ATableHasTheScreensWidth) {
     EXPECT_EQ(&terminalTable(*table).source(), &rows);
 }
 
-TEST_F(TerminalToolkitTest, ALayoutIsAListAndAFieldWhateverItsName) {
+TEST_F(TerminalToolkitTest, LayoutsOfAnyNameGiveAListAndAField) {
     TextRows rows{"A"};
     const ui::ModalOutlets outlets = toolkit.loadLayout("Any name", rows);
     EXPECT_EQ(&terminalTable(*outlets.list).source(), &rows);
