@@ -318,7 +318,7 @@ TEST(Options, WrongUsageOfTheServiceAndTheRecorderIsOneClearSentence) {
               "--rotate-seconds (see pallax record --help)\n");
 }
 
-TEST(Options, UnknownOptionsAreNamed) {
+TEST(Options, WrongArgumentsAreNamed) {
     EXPECT_NE(wrongUsage({"--colour", "red"}).find("--colour"), std::string::npos);
     EXPECT_NE(wrongUsage({"a.pcap", "b.pcap"}).find("b.pcap"), std::string::npos);
     EXPECT_EQ(wrongUsage({"--loop"}), "pallax: --loop requires RECORDING (see pallax --help)\n");

@@ -58,7 +58,7 @@ TEST(PaneRowTest, ANumberWithoutAUnitHasNone) {
     EXPECT_EQ(row.unit, "");
 }
 
-TEST(PaneRowTest, ATextOfDigitsIsNotANumber) {
+TEST(PaneRowTest, ATextThatReadsAsANumberIsNotANumber) {
     const PaneRow row = rowOf(leafNode("Power", "-94 dBm"));
     EXPECT_EQ(row.number, std::nullopt);
     EXPECT_EQ(row.unit, "");
