@@ -12,7 +12,7 @@
 namespace pallax::doubles {
 
 /// A stack that records its calls and drives its screens' life cycle: a screen is loaded and
-/// appears when it reaches the top, after the delegate has been told.
+/// appears when it reaches the top, after the delegate was called.
 class FakeNavigationStack final : public ui::NavigationStack {
 public:
     using ScreenRef = std::shared_ptr<ui::TableScreen>;
@@ -56,7 +56,7 @@ public:
         modal.reset();
     }
 
-    /// The root appears with its window: it is not navigated to, so the delegate is not told.
+    /// The root appears with its window: it is not navigated to, so the delegate is not called.
     void appearWithWindow() {
         top().viewDidLoad();
         top().viewWillAppear(false);

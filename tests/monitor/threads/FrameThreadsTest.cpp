@@ -12,15 +12,15 @@
 #include <set>
 #include <thread>
 
-// Frames are read by a second thread while packets change the display that they were made of. Built
-// with -fsanitize=thread, these tests find what a frame shares with the live display.
+// A second thread reads frames while packets change the display from which they were made. Built
+// with -fsanitize=thread, these tests detect data shared by a frame and the live display.
 
 namespace pallax {
 namespace {
 
 using namespace std::chrono_literals;
 
-/// All that a frame tells of a node and of those below it.
+/// The content of a frame for a node and the nodes below it.
 void tell(const Frame& frame, const PallaxModelNode& node, std::string& text) {
     const Frame::Stamp& stamp = frame.stamp(node);
     text += node.displayName();
@@ -50,7 +50,7 @@ std::string textOf(const Frame& frame) {
     return text;
 }
 
-/// The packets of a sample recording, which is a little-endian pcap file.
+/// The packets of a sample recording in a little-endian pcap file.
 std::vector<ByteBuffer> packetsOf(const std::string& sample) {
     constexpr std::size_t kFileHeader = 24;
     constexpr std::size_t kPacketHeader = 16;
@@ -71,7 +71,7 @@ std::vector<ByteBuffer> packetsOf(const std::string& sample) {
     return packets;
 }
 
-/// Reads each frame in a thread of its own, when it comes and again in the end.
+/// Reads each frame in its own thread, first when it is made and again at the end.
 class ReadingThread final : public FrameObserver {
 public:
     ReadingThread() : _thread([this] { read(); }) {}
@@ -96,10 +96,10 @@ public:
         }
     }
 
-    /// Texts of each frame, which are one where it does not change.
+    /// The texts of each frame: a single one if the frame does not change.
     using Texts = std::map<std::uint64_t, std::set<std::string>>;
     Texts expected;
-    Texts seen; ///< by the thread; after its end
+    Texts seen; ///< filled by the thread; valid after its end
 
 private:
     void read() {
@@ -124,7 +124,7 @@ private:
     std::condition_variable _changed;
     std::vector<FrameRef> _frames;
     bool _isOver = false;
-    std::thread _thread; // starts when the rest is there
+    std::thread _thread; // started after the other members exist
 };
 
 /// A model with the real generators and their templates.
