@@ -70,7 +70,8 @@ TEST(UTRANLogGenerator, ItsCreationIsLoggedBehindTheBase) {
     ASSERT_GE(created.size(), 4U);
     EXPECT_EQ(created.rbegin()[3].text.substr(0, 38), "Creating ZORLogGenerator2 object with ");
     EXPECT_EQ(created.rbegin()[3].priority, 3);
-    EXPECT_EQ(created.rbegin()[2], (RecordingLog::Line{4, formatText("Creating Log object: %p", {self})}));
+    EXPECT_EQ(created.rbegin()[2],
+              (RecordingLog::Line{4, formatText("Creating Log object: %p", {self})}));
     EXPECT_EQ(created.rbegin()[1], (RecordingLog::Line{3, "Class Index: 1"}));
     EXPECT_EQ(created.back(), (RecordingLog::Line{3, "Created UTRANLogGenerator object"}));
 }
