@@ -277,10 +277,13 @@ constexpr auto kHiddenCodes = std::to_array<CodeLayout>({
 constexpr RecordLayout kHidden{
     .section = "Flights", .logLine = "Flights", .kind = SectionKind::List, .codes = kHiddenCodes};
 
+constexpr Time kNow{};
+
 TEST(LayoutRecord, ItsSinkGetsWhatTheDisplayDoesNotShow) {
     LayoutFixture fixture(kHidden);
     SampleLines sink;
-    fixture.record.setSink(&sink, 50);
+    fixture.record.setPlace(50, kNow);
+    fixture.record.setSink(&sink);
     (void)fixture.feed({1, 7, 8}, 100);
     EXPECT_EQ(sink.lines,
               (std::vector<std::string>{"[ 1", "{0 0", "50 Speed 7 raw 7", "}", "]", "[ 1", "{0 0",
@@ -292,7 +295,8 @@ TEST(LayoutRecord, ItsSinkGetsARecordAtOnceThatTheDisplayTakesLater) {
     LayoutFixture fixture(kHidden);
     fixture.record.display().setLate(true);
     SampleLines sink;
-    fixture.record.setSink(&sink, 50);
+    fixture.record.setPlace(50, kNow);
+    fixture.record.setSink(&sink);
     const std::vector<std::string> samples = {"[ 1", "{0 0", "53 Speed 9 raw 9", "}", "]"};
     (void)fixture.feed({1, 9}, 200);
     EXPECT_EQ(sink.lines, samples) << "after the three rows of the code before";
@@ -300,7 +304,7 @@ TEST(LayoutRecord, ItsSinkGetsARecordAtOnceThatTheDisplayTakesLater) {
     fixture.record.display().bringUpToDate();
     EXPECT_EQ(sink.lines, samples) << "once";
     EXPECT_EQ(fixture.section, PropertyList(Array{Dictionary{{"Speed", "9"}}}));
-    fixture.record.setSink(nullptr, 0);
+    fixture.record.setSink(nullptr);
     (void)fixture.feed({1, 9}, 200);
     EXPECT_EQ(sink.lines, samples) << "taken away";
 }
