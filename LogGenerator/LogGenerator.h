@@ -60,7 +60,7 @@ public:
     /// Also gives the samples of later packets to `sink`; null stops it. The caller begins and ends
     /// the packets. The sink must outlive the generator or be removed first.
     virtual void setSampleSink(SampleSink* /*sink*/) {}
-    /// When the values of the display, with every packet that has arrived, were last read.
+    /// The times at which the values of the display, brought up to date, were last read.
     SectionAges sectionAges(const Dictionary& state);
     /// True when this generator cannot update the display that an earlier one left in the state.
     virtual bool keepsDisplay(const Dictionary& state) const;
@@ -85,8 +85,7 @@ protected:
     /// Brings the live display in the state up to date with the latest packet, for generators that
     /// read packets late.
     virtual void bringDisplayUpToDate() {}
-    /// The ages in the live display of the state, which is up to date. Nothing is known of them
-    /// unless it is overridden.
+    /// The ages in the state's live display, which is up to date. Empty unless overridden.
     virtual SectionAges agesIn(const Dictionary& state) const;
 
     /// Selects the constructors of a generator without parts, which log and build nothing.

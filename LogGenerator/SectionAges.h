@@ -12,15 +12,15 @@ namespace pallax {
 /// When the values of the display were last read from a packet, changed or not.
 class SectionAges {
 public:
-    /// What stands at `path` of the display ("/" the root, "/Serving Cell", "/Serving Cell/ARFCN")
-    /// was read then.
+    /// Notes when the node at `path` of the display was read ("/" for the root, "/Serving Cell",
+    /// "/Serving Cell/ARFCN").
     void note(const std::string& path, Time read) {
         Time& noted = _read.try_emplace(path, read).first->second;
         noted = noted < read ? read : noted;
     }
 
-    /// The packet time of the latest reading of what stands at `path`. Nothing where no packet has
-    /// been read, where that is not known, and where the answer for the branch above holds.
+    /// The time of the packet from which the node at `path` was last read. Nothing if there is no
+    /// such packet, if the time is unknown, or if the time of the branch above applies.
     std::optional<Time> lastRead(std::string_view path) const {
         const auto found = _read.find(path);
         return found != _read.end() ? std::optional(found->second) : std::nullopt;

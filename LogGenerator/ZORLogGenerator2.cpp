@@ -19,7 +19,7 @@ const GeneratorEnvironment& announced(const GeneratorEnvironment& environment,
     return environment;
 }
 
-/// Of the sections below a branch of the display, whose path it is.
+/// Notes the ages of the sections below the branch at `path`.
 void noteAges(const Dictionary& branch, const std::string& path, const ClassIndex& index,
               SectionAges& ages) {
     for (const Dictionary::Entry& entry : branch) {

@@ -9,19 +9,19 @@
 
 namespace pallax {
 
-/// A generator with the state dictionary that its calls need, from packet to packet and from tick
-/// to tick. The state outlives each generator. Without a generator packets are lost and there is
-/// nothing to show.
+/// A generator with the state dictionary that its calls need, from packet to packet and tick to
+/// tick. The state outlives each generator. Without a generator, packets are dropped and the
+/// display is null.
 class DisplayDriver {
 public:
-    /// What the former generator has received is in the display.
+    /// Brings the display up to date with the packets of the old generator first.
     void setGenerator(std::unique_ptr<LogGenerator> generator) {
         (void)display();
         _generator = std::move(generator);
         setSampleSink(_sink);
     }
-    /// Gives the samples of later packets to `sink`, too, until it is null. The sink outlives the
-    /// driver, or is taken away.
+    /// Also gives the samples of later packets to `sink`; null stops it. The sink must outlive the
+    /// driver or be removed first.
     void setSampleSink(SampleSink* sink) {
         _sink = sink;
         if (_generator) {
@@ -29,11 +29,12 @@ public:
         }
     }
     const LogGenerator* generator() const { return _generator.get(); }
-    /// True when the generator cannot update the display that an earlier one has left.
+    /// True when the generator cannot update the display that an earlier one left.
     bool keepsDisplay() const { return _generator && _generator->keepsDisplay(_state); }
 
-    /// One packet; `origin` is for the sink of samples, to which it begins and ends in any case. An
-    /// exception of a record leaves, and the packet is then no new data.
+    /// Reads one packet. `origin` describes it to the sample sink; the packet begins and ends there
+    /// even if it is not read. Exceptions of records pass through, and the packet then does not
+    /// count as new data.
     void update(Bytes packet, const SamplePacket& origin = {}) {
         if (_sink == nullptr) {
             return updateState(packet);
@@ -47,20 +48,20 @@ public:
         }
         _sink->endPacket();
     }
-    /// At a display tick: whether packets have arrived since the tick before.
+    /// Called at a display tick: whether packets have arrived since the last one.
     bool takeUpdated() { return std::exchange(_updated, false); }
 
     /// The display of a tick. Rotates history and raw capture.
     PropertyList generate() {
         return _generator ? _generator->generateLogUsingState(_state) : PropertyList();
     }
-    /// The live display, with every packet that has arrived, or null when there is none yet.
+    /// The live display, up to date with the latest packet, or null when there is none yet.
     PropertyList display() { return _generator ? _generator->display(_state) : PropertyList(); }
-    /// As LogGenerator tells it.
+    /// As LogGenerator::sectionAges.
     SectionAges sectionAges() {
         return _generator ? _generator->sectionAges(_state) : SectionAges();
     }
-    /// What a snapshot saves. The sections of its displays are those of the live display.
+    /// The content of a snapshot. Its displays share the live display's sections.
     PropertyList saveContents() const {
         return _generator ? _generator->getSaveContentsFromState(_state) : PropertyList();
     }
@@ -73,7 +74,7 @@ private:
         _updated = true;
     }
 
-    std::unique_ptr<LogGenerator> _generator; // goes after the state
+    std::unique_ptr<LogGenerator> _generator; // destroyed after the state
     Dictionary _state;
     SampleSink* _sink = nullptr;
     bool _updated = false;

@@ -49,9 +49,9 @@ public:
     void configureGenerator() { _link.configureGenerator(); }
     bool isConnected() const { return _link.isConnected(); }
 
-    /// One packet of the log channel. An exception of a record leaves through here.
+    /// Reads one packet of the log channel. Exceptions of records pass through.
     void updateWithData(Bytes data);
-    /// Looks after the link, and after new data drops the tree and tells the observer.
+    /// Checks the link and, after new data, drops the tree and calls the observer.
     void refresh() { _link.refresh(); }
 
     /// The root of the display tree; null without a generator. The caller may keep it after the

@@ -4,13 +4,13 @@
 
 #include <string_view>
 
-/// The formats that several layouts share.
+/// Formats shared by several layouts.
 namespace pallax {
 
 inline constexpr NumberFormat kSignedLevelDb{"%+.2f dB"};
 inline constexpr NumberFormat kSignedLevelDbm{"%+.2f dBm"};
 
-/// Shown for what the phone measures only while it transmits.
+/// Shown for values that the phone measures only while it transmits.
 inline constexpr std::string_view kNotAvailable = "N/A";
 
 } // namespace pallax

@@ -5,7 +5,7 @@
 #include <array>
 #include <string_view>
 
-/// The tables of labels, each with the format that an index beyond it is shown under.
+/// The tables of labels, each with the format for numbers beyond the table.
 namespace pallax {
 
 inline constexpr NumberFormat kReserved{"[Reserved %d]", ""};

@@ -22,7 +22,7 @@ namespace pallax {
 
 namespace {
 
-/// In the order in which the start command names the codes.
+/// In the order of the codes in the start command.
 constexpr auto kCodes = std::to_array<const CodeLayout*>({
     &kFingerC2I,
     &kEVDOStatus,
@@ -44,7 +44,7 @@ DictionaryRef dictionaryUnder(std::string_view key, const Dictionary& state) {
 
 using PlaceRead = LookupDisplay::PlaceRead;
 
-/// Of the places below a branch of the display, whose path it is.
+/// Notes the ages of the places below the branch at `path`.
 void noteAges(const DictionaryRef& branch, const std::string& path,
               const std::vector<PlaceRead>& places, SectionAges& ages) {
     for (const Dictionary::Entry& entry : *branch) {
@@ -86,7 +86,7 @@ void C2KLogGenerator::processTemplate(const Dictionary& templateDictionary,
                                       Dictionary& storeLookupIntoDict) {
     for (const Dictionary::Entry& entry : templateDictionary) {
         if (!entry.hasStringKey) {
-            continue; // could neither be shown nor named as a place
+            continue; // not shown, and not usable as a place
         }
         if (const DictionaryRef section = entry.value.dictionary()) {
             const auto display = std::make_shared<Dictionary>();
@@ -133,13 +133,13 @@ void C2KLogGenerator::updateState(Dictionary& state, Bytes data) {
 }
 
 void C2KLogGenerator::updateFromLog(Bytes packet, const DictionaryRef& lookup, Dictionary& state) {
-    if (packet.size() < LogRecord::kHeaderLength) { // asked of the message, prefix included
+    if (packet.size() < LogRecord::kHeaderLength) { // the length includes the prefix
         return;
     }
     const LogRecord record(LogPacketStripPrefix(packet));
     const std::uint8_t type = record.u8(0);
     if (type != LogRecord::kStandardType) {
-        systemLog(LogPriority::Error, "Invalid log type: %x. Dropping.", type); // it is not
+        systemLog(LogPriority::Error, "Invalid log type: %x. Dropping.", type); // it is not dropped
     }
     const LogCode logCode = LogPacketGetLogCode(record);
     const auto* code =

@@ -10,15 +10,15 @@ namespace pallax {
 struct CodeLayout;
 class LookupDisplay;
 
-/// The generator of the CDMA technology, 1x and EV-DO. It has no records with sections of their
-/// own: the layout of a log code tells which value stands under which lookup name, and the
-/// template "C2KTemplate" says where that name is shown, in as many places as it likes.
+/// The generator of the CDMA technology, 1x and EV-DO. Instead of records with sections it has
+/// layouts that give each value a lookup name; the template "C2KTemplate" shows each name in any
+/// number of places.
 ///
-/// A template is a property list of dictionaries. In any of them a dictionary is a section, the
-/// string "_sorted" stands for itself, any other string is a lookup name, and the rest is ignored.
+/// A template is a property list of dictionaries. In each, a dictionary is a section, the string
+/// "_sorted" is copied, other strings are lookup names, and other types are ignored.
 ///
-/// The state's keys, beside those of every generator: "Lookup" (the lookup table, see C2KLookup.h)
-/// and the running values of the layouts.
+/// Additional keys of the state: "Lookup" (the lookup table, see C2KLookup.h) and the running
+/// values of the layouts.
 class C2KLogGenerator final : public ZORLogGenerator {
 public:
     static std::unique_ptr<LogGenerator> generator(const GeneratorEnvironment& environment);
@@ -29,22 +29,22 @@ public:
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
     void setSampleSink(SampleSink* sink) override;
-    /// Not where the state also holds the places of its values, which an earlier one has left.
+    /// False if the state has a lookup table from an earlier generator.
     bool keepsDisplay(const Dictionary& state) const override;
     PropertyList getStartCommand() const override;
 
-    /// Adds a template's rows to a display and their places to a lookup table.
+    /// Adds a template's rows to a display, and their places to a lookup table.
     static void processTemplate(const Dictionary& templateDictionary,
                                 const DictionaryRef& storeDisplayIntoDict,
                                 Dictionary& storeLookupIntoDict);
-    /// The display, made on first use; null while the template cannot be loaded.
+    /// The display, made at the first call; null if the template cannot be loaded.
     PropertyList getDisplayFromState(Dictionary& state) const;
-    /// Framing and dispatch of one packet. A packet of a known code is captured behind its prefix,
-    /// whether or not its layout accepts it; nothing else is captured. A wrong log type is
+    /// Checks the framing of one packet and dispatches it. Packets of known codes are captured,
+    /// without the prefix, even if their layout refuses them; others are not. A wrong log type is
     /// reported, but does not stop the packet.
     void updateFromLog(Bytes packet, const DictionaryRef& lookup, Dictionary& state);
 
-    /// The layouts in the order of the start command, in which their rows of fields are numbered.
+    /// The layouts in the order of the start command, in which their rows are numbered.
     static std::span<const CodeLayout* const> layouts();
 
 protected:

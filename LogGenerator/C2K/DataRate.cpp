@@ -22,7 +22,7 @@ void setExtraInfo(const Dictionary& state, std::string_view sequenceKey, std::in
     }
 }
 
-/// From one number of a 32-bit sequence to another, the shorter way round.
+/// The steps from one number of a 32-bit sequence to another, in the shorter direction.
 std::int32_t stepsBetween(std::int64_t before, std::uint32_t now) {
     return static_cast<std::int32_t>(now - static_cast<std::uint32_t>(before));
 }
@@ -57,7 +57,7 @@ std::int64_t weightedSum(std::span<const Counter> counters, const LogRecord& pac
     const Bytes bytes = packet.bytes();
     std::int64_t sum = 0;
     for (const Counter& counter : counters) {
-        if (packet.has(counter.byte + kCounterLength)) { // whole, so that it is one load
+        if (packet.has(counter.byte + kCounterLength)) { // checked once, for a single load
             const auto* at = bytes.data() + counter.byte;
             const std::uint32_t count = at[0] | std::uint32_t{at[1]} << 8U |
                                         std::uint32_t{at[2]} << 16U | std::uint32_t{at[3]} << 24U;

@@ -9,11 +9,11 @@
 
 namespace pallax {
 
-/// Under which names a link's running values are kept between packets.
+/// The names of a link's running values in the state.
 struct DataRateNames {
-    std::string_view sequence; ///< state key: the last packet's sequence number
-    std::string_view sent;     ///< state key: the last packet's total
-    /// Keys of the state's "ExtraInfo": the values just stored, and those of the packet before.
+    std::string_view sequence; ///< state key: the sequence number of the last packet
+    std::string_view sent;     ///< state key: the total of the last packet
+    /// Keys of the state's "ExtraInfo": the new values, and those of the packet before.
     std::string_view sequenceNow;
     std::string_view sentNow;
     std::string_view sequenceBefore;
@@ -26,14 +26,14 @@ inline constexpr std::string_view kDataRateFormula =
     "growth of the sequence number; empty at the first packet, unchanged where the number has not "
     "grown";
 
-/// The rate since the link's last packet, in kbps: what has been sent meanwhile per 1024 steps of
-/// the sequence number, which is 32 bits wide and wraps. Null, so that the rate stays as it is,
-/// when the sequence number has not grown; it is negative when the total has fallen, and empty
-/// after the first packet. Then keeps the new values.
+/// The rate since the link's last packet in kbps: the growth of the total per 1024 steps of the
+/// sequence number, which has 32 bits and wraps. Null (the shown rate does not change) if the
+/// sequence number has not grown, negative if the total has fallen, and empty after the first
+/// packet. Then stores the new values.
 PropertyList dataRateSince(const DataRateNames& names, std::uint32_t sequence, std::int64_t sent,
                            Dictionary& state);
 
-/// What the counters add up to that the packet holds whole, each with its weight.
+/// The sum of the counters that are whole in the packet, each with its weight.
 std::int64_t weightedSum(std::span<const Counter> counters, const LogRecord& packet);
 
 } // namespace pallax

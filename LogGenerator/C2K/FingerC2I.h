@@ -4,7 +4,7 @@
 
 namespace pallax {
 
-/// What the fingers of the EV-DO receiver are locked to, and how well.
+/// The pilots to which the fingers of the EV-DO receiver are locked, and their levels.
 ///
 ///   0x108A, at least 23 bytes, and exactly 14 more for each finger, little-endian
 ///   byte      width    lookup name   shown as

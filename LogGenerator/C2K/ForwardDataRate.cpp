@@ -15,7 +15,7 @@ constexpr Position kSequence = u32At(13);
 constexpr std::size_t kCountersStart = 17;
 constexpr std::size_t kCounterLength = 4;
 
-/// What one step of each counter adds to the total; nothing where it is 0.
+/// The weight of each counter in the total; 0: it does not count.
 constexpr auto kWeights = std::to_array<std::uint16_t>({
     128,  256,  512,  1024, 0, //
     128,  256,  512,  1024, 0, //
@@ -36,7 +36,7 @@ constexpr auto kWeights = std::to_array<std::uint16_t>({
 static_assert(kWeights.size() == 56);
 static_assert(kCountersStart + kWeights.size() * kCounterLength == kMinimumLength);
 
-/// The counters that have a weight.
+/// The counters with a weight.
 constexpr auto kCounters = [] {
     constexpr std::size_t kWithoutWeight =
         static_cast<std::size_t>(std::count(kWeights.begin(), kWeights.end(), 0));

@@ -4,7 +4,7 @@
 
 namespace pallax {
 
-/// How much the EV-DO forward link has carried: counters, each with a weight of its own. Shown as a
+/// The amount of data on the EV-DO forward link: counters, each with its own weight. Shown as a
 /// rate; see DataRate.h.
 ///
 ///   0x1192, at least 241 bytes, little-endian

@@ -134,7 +134,7 @@ void LookupDisplay::beginList(const SampleList& list) {
 }
 
 void LookupDisplay::beginEntry(std::size_t index, std::int64_t name) {
-    constexpr std::size_t kDigits = 20; // of any number of 64 bits
+    constexpr std::size_t kDigits = 20; // for any 64-bit number
     std::array<char, 2 * kDigits + 1> key{};
     char* end = std::to_chars(key.data(), key.data() + kDigits, index).ptr;
     *end++ = ';';

@@ -11,34 +11,34 @@
 
 namespace pallax {
 
-/// The display sink of CDMA: stores each value in every place that the lookup table has for its
-/// name. A list by pilot becomes a dictionary that is shown sorted, whose key "INDEX;PN" gives each
-/// entry its place by the index (as text: 10 comes before 2) and its name, the pilot's PN offset.
+/// The display sink of CDMA: stores each value in all places that the lookup table has for its
+/// name. A list by pilot becomes a sorted dictionary with the keys "INDEX;PN": the index (as text:
+/// 10 comes before 2) gives the order, and the pilot's PN offset is the shown name.
 ///
-/// Between two looks at the display a modem sends many packets of one code, each of which replaces
-/// all that the one before has shown. Such a packet is kept, and read when the display is looked
-/// at; the layout tells which may be.
+/// Between two ticks a modem sends many packets of one code, and each replaces everything that the
+/// one before has shown. This sink keeps the latest and reads it when the display is needed. The
+/// layout tells which packets may wait.
 class LookupDisplay final : public SampleSink {
 public:
     static constexpr bool kTakesHidden = false;
 
-    /// The layouts live as long as the program.
+    /// The layouts must live as long as the program.
     explicit LookupDisplay(std::span<const CodeLayout* const> codes);
 
-    /// Gives the samples of later packets to `sink`, too, each when it arrives. Null: to the
-    /// display alone. The sink outlives the display, or is taken away.
+    /// Also gives the samples of later packets to `sink`, each when it arrives; null stops it. The
+    /// sink must outlive the display or be removed first.
     void setSink(SampleSink* sink) { _sink = sink; }
 
-    /// Of the packet that is taken next.
+    /// Sets the time of the next packet.
     void setPacketTime(Time time) { _packetTime = time; }
-    /// Takes an accepted packet of the code that is the `index`th. Without a lookup table (null) no
-    /// value has a place.
+    /// Takes an accepted packet of the code number `index`. Without a lookup table (null) values
+    /// have no places.
     void take(std::size_t index, const LogRecord& packet, const DictionaryRef& lookup,
               Dictionary& state);
-    /// Reads the packets that are kept.
+    /// Reads the kept packets.
     void bringUpToDate();
 
-    /// When what is shown in a place was last read.
+    /// The time at which a place was last read.
     struct PlaceRead {
         LookupPlace place;
         Time time;
@@ -46,7 +46,7 @@ public:
     std::vector<PlaceRead> placesRead() const;
 
     void sample(const Sample& sample) override;
-    void keyRemoved(std::string_view /*key*/) override {} // a value stays until the next
+    void keyRemoved(std::string_view /*key*/) override {} // a value stays until the next one
     void beginList(const SampleList& list) override;
     void endList() override;
     void beginEntry(std::size_t index, std::int64_t name) override;
@@ -57,7 +57,7 @@ private:
         const CodeLayout* layout;
         FieldId firstRow;
         bool isReadLate;
-        // The latest packet that waits, and the table for it; null: none.
+        // The latest packet that waits, and its lookup table; null: none.
         DictionaryRef lookup = nullptr;
         ByteBuffer packet = {};
         Time time = {};
@@ -73,13 +73,13 @@ private:
     SampleSink* _sink = nullptr;
     Time _packetTime{};
     ReadTimes _times;
-    /// The table that the places are of. Looking each value up in it took a quarter of the time of
+    /// The lookup table of the cached places. Looking up each value took a quarter of the time of
     /// decoding a CDMA drive.
     DictionaryRef _lookup;
     std::vector<std::vector<LookupPlace>> _places; ///< by row
-    DictionaryRef _pilots;                         ///< of the list that has begun and not ended
+    DictionaryRef _pilots;                         ///< of the current list
     const ListLayout* _list = nullptr;
-    std::string _pilot; ///< the key of its entry
+    std::string _pilot; ///< the key of the current entry
 };
 
 } // namespace pallax

@@ -25,7 +25,7 @@ constexpr Position kDeviceState = u8At(4);
 constexpr std::int64_t kTraffic = 8;
 constexpr Condition kIsInTraffic{kDeviceState, kTraffic, kTraffic, kNotAvailable, kSystemStateId};
 
-/// Of a call that is over: shown once, and forgotten.
+/// The rate of an ended call, which is shown once and then forgotten.
 PropertyList oldFrameErrors(const Place& place) {
     Dictionary& state = *place.memory->state;
     const auto rate = place.here.read(kDeviceState) != kTraffic ? trafficFER(state) : std::nullopt;
@@ -79,7 +79,7 @@ constexpr Position kPN = u16At(12); // from a pilot's start
 
 constexpr NumberFormat kReferenceLevelDb{"(ref pilot) %+.2f dB"};
 
-/// Where a pilot's energy stands in it.
+/// The position of a pilot's energy in its entry.
 std::size_t energyAt(const LogRecord& activeSet) {
     return 4 * static_cast<std::size_t>(activeSet.read(kPilotSize)) + 24;
 }
@@ -91,7 +91,7 @@ EntryList::Layout pilotsIn(const LogRecord& activeSet) {
             .bytesRead = energyAt(activeSet) + sizeof(std::uint16_t)};
 }
 
-/// A divisor of 0 leaves no number; it then shows the least level.
+/// A divisor of 0 gives NaN, which is shown as the least level.
 PropertyList pilotLevel(const Place& place) {
     constexpr double kLeast = 0.00001;
     const LogRecord& activeSet = place.around;

@@ -35,8 +35,7 @@ namespace pallax {
 ///   4m + 24  16     energy E: 10 x log10(max(2^(2e - 3) x E / (9 x N^2 x g) - 1 / N, 0.00001)), dB
 ///
 /// The list ends before the first pilot that reaches past the packet. Outside Traffic the frame
-/// error rate of the call that has ended is shown once more, as old ("k1xTrafficFER"), and
-/// forgotten.
+/// error rate of the ended call is shown once more, as old ("k1xTrafficFER"), and then forgotten.
 extern const CodeLayout kOneXStatus;
 
 } // namespace pallax

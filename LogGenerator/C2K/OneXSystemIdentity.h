@@ -4,7 +4,7 @@
 
 namespace pallax {
 
-/// Which 1x system serves the phone.
+/// The 1x system that serves the phone.
 ///
 ///   0x134F, at least 171 bytes, version 2 or higher, little-endian
 ///   byte  width  lookup name         shown as

@@ -4,7 +4,7 @@
 
 namespace pallax {
 
-/// Whether a frame of the 1x traffic channel was in error; the rate of such frames is averaged.
+/// Whether a frame of the 1x traffic channel had an error; the error rate is averaged.
 ///
 ///   0x119D, at least 17 bytes, made of subpackets
 ///   byte  width  lookup name     shown as

@@ -4,7 +4,7 @@
 
 namespace pallax {
 
-/// Whether the packet has the length that its layout demands; logs it when it has not.
+/// Whether the packet has the length that its layout requires; if not, this is logged.
 bool hasLength(const CodeLayout& code, const LogRecord& packet);
 
 } // namespace pallax

@@ -8,10 +8,10 @@
 
 namespace pallax {
 
-/// What a list by pilot shows that has no entry.
+/// Shown for an empty list by pilot.
 inline constexpr std::string_view kNoPilots = "(none)";
 
-/// The energy of a pilot, whose 16 bits stand at `Byte` of its entry; minus infinity for 0.
+/// The energy of a pilot, 16 bits at `Byte` of its entry; minus infinity for 0.
 template <std::size_t Byte>
 PropertyList pilotEnergy(const Place& place) {
     constexpr double kFullScale = 512.0;

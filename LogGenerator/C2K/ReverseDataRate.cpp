@@ -20,12 +20,12 @@ constexpr std::size_t kRowLength = 288;
 constexpr std::size_t kRateLength = 24;
 constexpr std::size_t kCountersInARow = 4;
 
-/// What one step of a rate's counters adds to the total.
+/// The weight of each rate's counters in the total.
 constexpr auto kWeights = std::to_array<std::uint16_t>(
     {128, 256, 512, 768, 1024, 1536, 2048, 3072, 4096, 6144, 8192, 12288});
 static_assert(kWeights.size() == 12);
 
-/// By rate, over all blocks, in both rows.
+/// The counters by rate, in all blocks and both rows.
 constexpr auto kCounters = [] {
     constexpr std::size_t kCountersOfARate = kBlocks * kRows * kCountersInARow;
     std::array<Counter, kWeights.size() * kCountersOfARate> counters{};

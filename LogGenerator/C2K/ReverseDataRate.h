@@ -4,8 +4,8 @@
 
 namespace pallax {
 
-/// How much the EV-DO reverse link has carried: counters by rate, each rate with a weight of its
-/// own. Shown as a rate; see DataRate.h.
+/// The amount of data on the EV-DO reverse link: counters by rate, each rate with its own weight.
+/// Shown as a rate; see DataRate.h.
 ///
 ///   0x127E, at least 1750 bytes, little-endian; the sequence number stands one byte later than
 ///   in the packet of the forward link

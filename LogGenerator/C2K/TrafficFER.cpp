@@ -30,7 +30,7 @@ float addTrafficFrame(bool inError, Dictionary& state) {
     constexpr float kDecay = 1.0F - kNewestWeight;
     float rate = inError ? kNewestWeight : 0.0F;
     if (const auto before = trafficFER(state)) {
-        // Product and sum are rounded one after the other; the build allows no fused operation.
+        // The product and the sum are rounded separately; the build does not fuse operations.
         const float decayed = kDecay * *before;
         rate += decayed;
     }

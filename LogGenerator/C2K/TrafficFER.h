@@ -7,26 +7,26 @@
 
 namespace pallax {
 
-/// The frame error rate of the 1x traffic channel, an exponential average between 0 and 1 that
-/// lives in the state under "TrafficFER" for as long as a call. Single precision throughout.
+/// The frame error rate of the 1x traffic channel: an exponential average between 0 and 1, kept in
+/// the state under "TrafficFER" during a call. All in single precision.
 
-/// The lookup name under which it is shown, and how: in per cent.
+/// Its lookup name; it is shown in per cent.
 inline constexpr std::string_view kTrafficFERName = "k1xTrafficFER";
 inline constexpr NumberFormat kTrafficFERFormat{"%.02f%%"};
 inline constexpr NumberFormat kOldTrafficFERFormat{"%.02f%% (old)", "%"};
 
-/// The rate so far; nothing when no call has reported a frame yet.
+/// The current rate; nothing before the call's first frame.
 std::optional<float> trafficFER(const Dictionary& state);
 
-/// Adds a frame with the weight 1/64 and gives the new rate, which is kept.
+/// Adds a frame with the weight 1/64, stores the new rate and returns it.
 float addTrafficFrame(bool inError, Dictionary& state);
 
-/// Forgets the rate, so that the next call starts anew.
+/// Removes the rate, so that the next call starts without one.
 void endTrafficFER(Dictionary& state);
 
-/// A rate as shown.
+/// The display value of a rate.
 PropertyList shownTrafficFER(float rate);
-/// The same, of a call that is over.
+/// The same for a call that has ended.
 PropertyList shownOldTrafficFER(float rate);
 
 } // namespace pallax

@@ -13,13 +13,13 @@ namespace {
 constexpr int kUnknownTypeLine = 78;
 constexpr int kNotDeserializedLine = 90;
 
-// A value's class is its property-list type, under the name that every diagnostic gives it.
+// Types have the names that all property-list diagnostics use.
 [[noreturn]] void throwUnknownType(const PropertyList& object) {
     throw GSMLogGenerator::InternalInconsistencyException(
         formatText("Unknown object of type %@ encountered", {object.typeName()}), kUnknownTypeLine);
 }
 
-/// Throws what making the display form would.
+/// Throws the exceptions of making the display form.
 void requireDisplayForm(const PropertyList& object) {
     if (object.isString()) {
         return;
@@ -37,7 +37,7 @@ void requireDisplayForm(const PropertyList& object) {
     }
 }
 
-/// The display form of a value inside a container.
+/// The display form of a value in a container.
 PropertyList collapsedForm(const PropertyList& object) {
     PropertyList form = GSMLogGenerator::processObject(object);
     PropertyList single = GSMLogGenerator::canCollapse(form);
@@ -62,7 +62,7 @@ Array displayForm(const Array& elements) {
     display.reserve(elements.size());
     bool isFirst = true;
     for (const PropertyList& element : elements) {
-        PropertyList form = collapsedForm(element); // of the first as well, for its types
+        PropertyList form = collapsedForm(element); // the first as well, to check its types
         if (!isFirst) {
             display.push_back(std::move(form));
         }
@@ -90,7 +90,7 @@ void GSMLogGenerator::updateState(Dictionary& state, Bytes data) {
         throw InternalInconsistencyException("Could not deserialize the object",
                                              kNotDeserializedLine);
     }
-    requireDisplayForm(*object); // before anything is stored, for it may throw
+    requireDisplayForm(*object); // may throw, so before anything is stored
     state.setFixed("DisplayState", *object);
     state.setFixed("Display", displayToCome(*object));
     state.setFixed("ExtraInfo", Dictionary());

@@ -12,21 +12,21 @@
 
 namespace pallax {
 
-/// The generator of the IFX modem, whose log channel carries serialized objects: each message is
-/// one property list, in any of the forms, of dictionaries, arrays and strings, and holds the
-/// whole picture. The display is that object, simplified; nothing of an earlier message stays.
+/// The generator of the IFX modem, whose log channel carries serialized objects. Each message is a
+/// property list, in any form, of dictionaries, arrays and strings, and contains the whole picture.
+/// The display is that object, simplified; earlier messages leave nothing in it.
 class GSMLogGenerator final : public LogGenerator {
 public:
-    /// A message breaks what this generator counts on. The state is then as it was before the
-    /// message. Nothing in the core catches it.
+    /// A message is not in the expected form. It does not change the state. The core does not catch
+    /// this.
     class InternalInconsistencyException : public std::runtime_error {
     public:
         static constexpr const char* kFile = "LogGenerator/GSM/GSMLogGenerator";
 
-        /// `line` is the number by which a failure is known; it does not follow the source.
+        /// `line` identifies the failure; it is not a line of this source.
         InternalInconsistencyException(const std::string& message, int line);
 
-        /// "Could not deserialize the object"; what() has the location behind it.
+        /// "Could not deserialize the object"; what() also has the location.
         std::string_view message() const { return _message.view(); }
         const char* file() const { return kFile; }
         int line() const { return _line; }
@@ -41,23 +41,23 @@ public:
     explicit GSMLogGenerator(const GeneratorEnvironment& environment) : LogGenerator(environment) {}
     ~GSMLogGenerator() override;
 
-    /// Throws InternalInconsistencyException for what is no property list, an empty message
-    /// included, and for a value of another type than the three anywhere in it.
+    /// Throws InternalInconsistencyException for a message that is not a property list or is empty,
+    /// and for values of other types anywhere in it.
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
     void setSampleSink(SampleSink* sink) override { _sink = sink; }
-    /// Every message is the whole display.
+    /// Always false: every message is the whole display.
     bool keepsDisplay(const Dictionary& /*state*/) const override { return false; }
     PropertyList getStartCommand() const override;
     PropertyList getSaveContentsFromState(const Dictionary& state) const override;
 
-    /// The display form: in new containers, at every level below the top, a dictionary of one
-    /// entry gives way to that entry's value, so that chains of them fold completely. The first
-    /// element of every array is left out, though it too must be of the three types. Throws
-    /// InternalInconsistencyException for another one.
+    /// The display form, in new containers: below the top, each dictionary of one entry is replaced
+    /// by that entry's value, so that chains of them collapse completely. The first element of each
+    /// array is left out, but also checked: throws InternalInconsistencyException for values of
+    /// other types.
     static PropertyList processObject(const PropertyList& object);
 
-    /// The single value of a dictionary that has exactly one entry; null for anything else.
+    /// The value of a dictionary with exactly one entry; null for all others.
     static PropertyList canCollapse(const PropertyList& object);
 
 protected:
@@ -65,12 +65,12 @@ protected:
     SectionAges agesIn(const Dictionary& state) const override;
 
 private:
-    /// The display of an object whose values are of the three types; that of a dictionary is empty
-    /// until `bringDisplayUpToDate`, for mostly the next message comes before anybody looks.
+    /// The display of an object whose types were checked. A dictionary stays empty until
+    /// `bringDisplayUpToDate`, because usually the next message comes before the display is needed.
     PropertyList displayToCome(const PropertyList& object);
 
-    DictionaryRef _unshown;    // the object whose display is still to be made, or null
-    DictionaryRef _display;    // that display, empty until then; it is in the state
+    DictionaryRef _unshown;    // the object whose display is not made yet, or null
+    DictionaryRef _display;    // its display in the state, empty until then
     std::optional<Time> _read; // when the latest message came
     SampleSink* _sink = nullptr;
     ObjectSamples _samples;

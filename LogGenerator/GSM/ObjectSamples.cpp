@@ -15,7 +15,8 @@ bool isDigit(char character) {
     return character >= '0' && character <= '9';
 }
 
-/// Of what follows a number: one word behind a blank, or a per cent sign. Nothing for other words.
+/// The unit in the text after a number: one word after a blank, or a per cent sign. Nothing for
+/// other texts.
 std::optional<std::string_view> unitIn(std::string_view rest) {
     if (rest.empty() || rest == "%") {
         return rest;
@@ -27,7 +28,7 @@ std::optional<std::string_view> unitIn(std::string_view rest) {
     return rest.substr(1);
 }
 
-/// The number in a text that is one, with its unit if it has one.
+/// The number in a text, with its unit if it has one; nothing for other texts.
 std::optional<NumberText> numberIn(std::string_view text) {
     const std::size_t sign = !text.empty() && (text[0] == '-' || text[0] == '+') ? 1 : 0;
     if (text.size() == sign || !isDigit(text[sign])) {
@@ -73,7 +74,7 @@ void ObjectSamples::walk(const PropertyList& object) {
     }
 }
 
-/// As the display shows it: a dictionary of one entry gives way to that entry's value.
+/// Walks the display form: a dictionary of one entry is replaced by that entry's value.
 void ObjectSamples::walkCollapsed(const PropertyList& object, std::string_view name) {
     const std::size_t length = _path.size();
     _path += '/';

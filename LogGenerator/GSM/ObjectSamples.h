@@ -14,15 +14,16 @@
 namespace pallax {
 
 /// The samples of an object stream. Its objects have no layouts: a field is a path in the display,
-/// "/Serving Cell/ARFCN", and gets its number when a message first has it. A list has its path as
-/// key; its entries share their paths, with "*" in place of an index: "/Neighbour Cells/*/ARFCN".
+/// "/Serving Cell/ARFCN", and is numbered when a message first contains it. A list's key is its
+/// path. Entries share their paths, with "*" in place of an index: "/Neighbour Cells/*/ARFCN".
 class ObjectSamples {
 public:
-    /// Of values and lists; further ones are left out, for messages may name paths without end.
+    /// The limit for values and lists; further paths are left out, because messages may contain any
+    /// number.
     static constexpr std::size_t kMostPaths = 4096;
 
-    /// Gives what the display form of the object holds to the sink. A path that the object before
-    /// had and this one has not is a removed key. The object's values are of the three types.
+    /// Gives the content of the object's display form to the sink. A path of the previous object
+    /// that this one lacks is a removed key. The object's types must have been checked.
     void give(const PropertyList& object, SampleSink& sink);
 
 private:
@@ -38,18 +39,18 @@ private:
     void walkCollapsed(const PropertyList& object, std::string_view name);
     void giveText(std::string_view text);
     void giveList(const Array& elements);
-    /// The number of the path, or kNoField when there are too many.
+    /// The number of the current path, or kNoField when there are too many.
     FieldId take();
     void removeOthers(const std::vector<FieldId>& before);
 
     std::unordered_map<std::string, FieldId, Hash, std::equal_to<>> _ids;
-    std::deque<Field> _fields;   ///< by number; keys are those of `_ids`
-    std::vector<FieldId> _shown; ///< outside of lists, of the latest object
+    std::deque<Field> _fields;   ///< by number; `_ids` owns the keys
+    std::vector<FieldId> _shown; ///< outside lists, in the latest object
 
     // While an object is walked:
     SampleSink* _sink = nullptr;
     std::string _path;
-    std::size_t _lists = 0; ///< begun and not ended
+    std::size_t _lists = 0; ///< open lists
 };
 
 } // namespace pallax

@@ -38,10 +38,10 @@ public:
     const std::vector<Numbered>& records() const { return _records; }
     /// The record of that section, or null.
     const Numbered* recordOf(std::string_view sectionName) const;
-    /// Of the packet whose records follow.
+    /// Sets the time of the packet whose records follow.
     void setPacketTime(Time time) { _packetTime = time; }
-    /// Gives the samples of all records to `sink`, too, until it is null. The sink outlives the
-    /// index, or is taken away.
+    /// Also gives the samples of all records to `sink`; null stops it. The sink must outlive the
+    /// index or be removed first.
     void setSink(SampleSink* sink);
     /// Brings every section up to date with the latest log record.
     void bringDisplayUpToDate() const;

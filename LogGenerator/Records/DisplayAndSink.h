@@ -6,11 +6,11 @@
 
 namespace pallax {
 
-/// One pass for the display and another sink, over a packet that must be read once. What is kept
-/// from the display goes to the other sink alone.
+/// Reads a packet once for the display and another sink. Values that are not shown go only to the
+/// other sink.
 class DisplayAndSink final : public SampleSink {
 public:
-    /// Both outlive it.
+    /// Both must outlive it.
     DisplayAndSink(SampleSink& display, SampleSink& sink) : _display(display), _sink(sink) {}
 
     void sample(const Sample& sample) override {
@@ -49,7 +49,7 @@ private:
 
     SampleSink& _display;
     SampleSink& _sink;
-    std::size_t _hiddenLists = 0; ///< begun and not ended: a hidden one, and those in it
+    std::size_t _hiddenLists = 0; ///< open hidden lists, with the lists in them
 };
 
 } // namespace pallax

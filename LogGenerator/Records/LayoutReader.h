@@ -82,7 +82,7 @@ private:
         _next = id;
     }
 
-    /// Apart, because it is rare and would slow the loop down.
+    /// Not inlined, because it is rare and would slow the loop down.
     [[gnu::noinline]] void readSpecial(const Field& field, FieldId id, const LogRecord& place) {
         if (field.condition != nullptr) {
             const std::int64_t number = numberOf(*field.condition, place);
@@ -172,7 +172,7 @@ private:
         return std::any_of(list.fields.begin(), list.fields.end(),
                            [](const Field& field) { return field.condition != nullptr; });
     }
-    /// An entry may be longer where a condition holds.
+    /// Entries for which a condition holds may be longer than the others.
     static bool holdsItsFields(const ListLayout& list, const LogRecord& entry) {
         for (const Field& field : list.fields) {
             if (field.condition == nullptr || !field.position) {

@@ -38,7 +38,7 @@ LayoutRecord::LayoutRecord(const RecordLayout& layout) : _layout(layout), _displ
 }
 
 void LayoutRecord::updateSectionRef(PropertyList section) {
-    _display.bringUpToDate(); // what was kept is for the section before
+    _display.bringUpToDate(); // the kept record belongs to the old section
     Base::updateSectionRef(std::move(section));
     _display.setSection(sectionRef());
 }
@@ -124,7 +124,7 @@ bool LayoutRecord::accepts(const CodeLayout& layout, const LogRecord& record) {
 
 void LayoutRecord::readNow(const Code& code, const LogRecord& record) {
     const CodeLayout& layout = *code.layout;
-    _display.bringUpToDate(); // with what is remembered until now
+    _display.bringUpToDate(); // with the entries remembered so far
     _display.times().setPacket(packetTime());
     remember(layout, record, _memory);
     const FieldId first = _firstRow + code.firstRow;

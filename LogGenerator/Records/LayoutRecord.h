@@ -13,41 +13,41 @@ namespace pallax {
 /// A record class whose layout is its decoder.
 class LayoutRecord : public Base {
 public:
-    /// `layout` lives as long as the program.
+    /// `layout` must live as long as the program.
     explicit LayoutRecord(const RecordLayout& layout);
 
     const RecordLayout& layout() const { return _layout; }
     std::string_view getSectionName() const override { return _layout.section; }
     std::span<const LogCode> getLogCodeArray() const override { return _logCodes; }
     void updateSectionRef(PropertyList section) override;
-    /// Logs what the record tells, and gives its samples to the sink at once; the display may take
-    /// them later.
+    /// Logs the record and gives its samples to the sink at once; the display may read it later.
     void updateWithData(const LogRecord& record, LogCode logCode) override;
 
-    /// What kind of section the template must hold for this record.
+    /// The kind of section that the template must hold for this record.
     SectionKind sectionKind() const { return _layout.kind; }
-    /// Shows the section.
+    /// The display sink of the section.
     SectionDisplay& display() { return _display; }
 
-    /// This record's rows are numbered from `first` on, and `packet` is the time of each packet
-    /// when it arrives; it outlives the record. Without them: from 0 on, and no time.
+    /// `first` is the number of this record's first row. `packet` has the time of each packet when
+    /// it arrives and must outlive the record. Before the first call rows count from 0 and have no
+    /// time.
     void setPlace(FieldId first, const Time& packet);
-    /// Gives the samples of later records to `sink`, too. Null: to the display alone. The sink
-    /// outlives the record, or is taken away.
+    /// Also gives the samples of later records to `sink`; null stops it. The sink must outlive the
+    /// record or be removed first.
     void setSink(SampleSink* sink) { _sink = sink; }
 
-    /// When the section was last read, and what it shows under a key of its own.
+    /// When the section, and each of its own keys, was last read.
     std::optional<Time> lastRead() const { return _display.times().latest(); }
     std::optional<Time> lastRead(std::string_view key) const;
 
 private:
-    /// What is worked out once of a code's layout: most packets need no more.
+    /// Facts about a code's layout, computed once; most packets need no others.
     struct Code {
         LogCode logCode;
         const CodeLayout* layout;
-        FieldId firstRow; ///< from the record's first
+        FieldId firstRow; ///< relative to the record's first
         std::size_t minimumLength;
-        bool isPlain; ///< a long enough record is accepted, and logs nothing of its own
+        bool isPlain; ///< long enough records are accepted, and log nothing further
         bool isReadLate;
         bool hasShapes;
     };

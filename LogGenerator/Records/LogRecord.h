@@ -104,8 +104,8 @@ public:
 private:
     static constexpr unsigned kByteBits = 8;
 
-    /// The bytes that hold a position, in the order of their places; what lies above is of no use.
-    /// Where 8 bytes are there they are loaded at once.
+    /// The bytes from `position.byte` on as one number; the caller drops the high bits. If 8 bytes
+    /// are available, they are loaded at once.
     std::uint64_t gather(const Position& position) const {
         if (std::endian::native != std::endian::little || position.bigEndian) {
             return gatherEach(position);
@@ -113,16 +113,16 @@ private:
         return has(position.byte + sizeof(std::uint64_t)) ? load<std::uint64_t>(position.byte)
                                                           : gatherLast(position.byte);
     }
-    /// Of a machine that is little-endian, too. The bytes are there.
+    /// For little-endian machines. The bytes must be available.
     template <class Number>
     std::uint64_t load(std::size_t at) const {
         Number number = 0;
         std::memcpy(&number, _bytes.data() + at, sizeof(number));
         return number;
     }
-    /// The fewer than 8 bytes from there to the end.
+    /// The bytes from there to the end, fewer than 8.
     std::uint64_t gatherLast(std::size_t at) const;
-    /// For the other order of bytes.
+    /// For big-endian positions and machines.
     std::uint64_t gatherEach(const Position& position) const;
 
     Bytes _bytes;

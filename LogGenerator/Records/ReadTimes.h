@@ -12,16 +12,16 @@
 
 namespace pallax {
 
-/// When what a display sink shows was last read: the packet times of rows of fields, and of lists
-/// and removed keys.
+/// The packet times at which a display sink last read rows of fields, replaced lists and removed
+/// keys.
 class ReadTimes {
 public:
-    /// For the rows from `first` on; others have no time.
+    /// Keeps times for the rows from `first` on; others have none.
     void setRows(FieldId first, std::size_t count) {
         _first = first;
         _rows.assign(count, kNever);
     }
-    /// Of the packet that is read next.
+    /// Sets the time of the next packet.
     void setPacket(Time packet) { _packet = packet; }
 
     void noteRow(FieldId row) {
@@ -29,7 +29,7 @@ public:
             _rows[place] = _packet;
         }
     }
-    /// A list is replaced or a key removed. The key lives as long as the program.
+    /// Notes that a list was replaced or a key removed. The key must live as long as the program.
     void noteKey(std::string_view key) {
         const auto found = std::find_if(_keys.begin(), _keys.end(),
                                         [key](const auto& each) { return each.first == key; });
@@ -49,7 +49,7 @@ public:
                                         [key](const auto& each) { return each.first == key; });
         return found != _keys.end() ? std::optional(found->second) : std::nullopt;
     }
-    /// Of all of it.
+    /// The latest time of all.
     std::optional<Time> latest() const {
         Time latest = kNever;
         for (const Time row : _rows) {

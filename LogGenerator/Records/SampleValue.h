@@ -8,37 +8,37 @@
 
 namespace pallax {
 
-/// A text that is a number, or a number and its unit: "62", "-96.0 dBm".
+/// A text with a number, or a number and its unit: "62", "-96.0 dBm".
 struct NumberText {
     std::string_view text;
     double number;
-    std::string_view unit; ///< part of the text; empty without one
+    std::string_view unit; ///< part of the text; may be empty
 };
 
-/// What a field shows: a number with its format, a label of a table, a text, or an object of a
+/// The value of a field: a number with its format, a label from a table, a text, or an object of a
 /// property list. Texts and objects that are not from a table are valid until the sample is taken.
 class SampleValue {
 public:
     SampleValue(const DisplayNumber& number) : _value(number) {}
     /// A text with static storage duration.
     static SampleValue label(std::string_view text) { return SampleValue(Value(Label{text})); }
-    /// A text that is made for this sample.
+    /// A text made for this sample.
     static SampleValue text(std::string_view text) { return SampleValue(Value(text)); }
     static SampleValue text(const NumberText& text) { return SampleValue(Value(&text)); }
     static SampleValue object(const PropertyList& object) { return SampleValue(Value(&object)); }
 
-    /// Null for everything else, as are those below.
+    /// Null for all other values; the same applies to the functions below.
     const DisplayNumber* number() const { return std::get_if<DisplayNumber>(&_value); }
     const PropertyList* object() const {
         const auto* object = std::get_if<const PropertyList*>(&_value);
         return object != nullptr ? *object : nullptr;
     }
-    /// The number in a text, where one was read from it.
+    /// The number in a text, if one was read from it.
     const NumberText* numberText() const {
         const auto* text = std::get_if<const NumberText*>(&_value);
         return text != nullptr ? *text : nullptr;
     }
-    /// The text of a label or text; empty for everything else.
+    /// The text of a label or text; empty for all other values.
     std::string_view words() const {
         if (const auto* label = std::get_if<Label>(&_value)) {
             return label->text;
@@ -50,7 +50,7 @@ public:
         return text != nullptr ? *text : std::string_view();
     }
 
-    /// Makes `target` a display value of it.
+    /// Stores the display value in `target`.
     void showIn(PropertyList& target) const {
         if (const DisplayNumber* display = number()) {
             target.assign(*display);

@@ -27,21 +27,22 @@ public:
 
     /// Whether records may wait until the display is brought up to date; false at first.
     void setLate(bool isLate) { _isLate = isLate; }
-    /// How a record is read. Null code: none.
+    /// How a record is read. If the code is null, there is no record.
     struct Reading {
         const CodeLayout* code = nullptr;
         FieldId firstRow = 0;
-        unsigned shape = 0; ///< its `shapeOf`, or 0 where the code has no shapes
+        unsigned shape = 0; ///< `shapeOf`, or 0 if the code has no shapes
         Time packet = {};
     };
-    /// Keeps an accepted record that may be read late, in place of the one before.
+    /// Keeps an accepted record that may be read late. The kept one before is dropped if its code
+    /// and shape are the same, else read.
     void keep(const Reading& reading, const LogRecord& record);
-    /// Reads the record that is kept.
+    /// Reads the kept record, if any.
     void bringUpToDate();
 
-    /// Whether it is the section.
+    /// Whether `value` is this section.
     bool shows(const PropertyList& value) const;
-    /// Of what the section shows.
+    /// When the section's values were last read.
     ReadTimes& times() { return _times; }
     const ReadTimes& times() const { return _times; }
 
@@ -75,7 +76,7 @@ private:
     ReadTimes _times;
 
     bool _isLate = false;
-    Reading _reading; ///< of the record that is kept
+    Reading _reading; ///< of the kept record
     ByteBuffer _kept;
 };
 
