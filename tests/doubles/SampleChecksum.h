@@ -11,11 +11,11 @@
 
 namespace pallax::doubles {
 
-/// A checksum of samples: over field, entry, raw number and value of each, in their order, and over
-/// the lists that begin and the keys that are removed. The same on every machine.
+/// A checksum of the field, entry, raw number and value of samples in their order, and of beginning
+/// lists and removed keys. The same on every machine.
 class SampleChecksum {
 public:
-    /// `value`: what one of the functions below makes of it.
+    /// `value` is the result of one of the functions below.
     void sample(FieldId field, std::optional<std::int64_t> raw, std::uint64_t value) {
         add(field * kFactors[0] + (raw ? static_cast<std::uint64_t>(*raw) : kNoRaw) * kFactors[1] +
             value * kFactors[2]);
@@ -23,7 +23,7 @@ public:
     void entry(std::size_t index, std::int64_t name) {
         add(index * kFactors[0] + static_cast<std::uint64_t>(name) * kFactors[1]);
     }
-    /// Of a list that begins, or of what is removed.
+    /// A beginning list or a removed key.
     void key(std::string_view key) { add(of(key)); }
 
     static std::uint64_t of(const DisplayNumber& number) {
@@ -47,7 +47,7 @@ public:
 private:
     static constexpr std::uint64_t kNoRaw = 0x5555'5555'5555'5555;
 
-    /// Odd, with bits everywhere.
+    /// Odd numbers with irregular bits.
     static constexpr std::array<std::uint64_t, 3> kFactors = {
         0x9E37'79B9'7F4A'7C15, 0xC2B2'AE3D'27D4'EB4F, 0x1656'67B1'9E37'79F9};
 
@@ -63,7 +63,7 @@ private:
         }
         return word;
     }
-    /// Only the turn and the sum wait for the sample before.
+    /// Only the rotation and the sum depend on the previous sample.
     void add(std::uint64_t number) {
         constexpr unsigned kHalf = 32;
         constexpr int kTurn = 13;

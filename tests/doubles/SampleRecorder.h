@@ -11,15 +11,15 @@
 
 namespace pallax::doubles {
 
-/// Keeps everything that a sink is given.
+/// Keeps all calls of a sink.
 class SampleRecorder final : public SampleSink {
 public:
     struct KeptSample {
         FieldId id;
         std::string key;
         std::optional<std::int64_t> raw;
-        PropertyList value;                          ///< as it is displayed
-        std::optional<double> number = std::nullopt; ///< that the text of an object holds
+        PropertyList value;                          ///< the display value
+        std::optional<double> number = std::nullopt; ///< the number in the text of an object
         std::string unit = {};
     };
     struct Begin {
@@ -70,7 +70,7 @@ public:
     }
     void endEntry() override { events.emplace_back(End::Entry); }
 
-    /// A line for each event, and forgets them.
+    /// Returns a line for each event and removes the events.
     std::vector<std::string> takeLines() {
         std::vector<std::string> lines;
         for (const Event& event : std::exchange(events, {})) {
@@ -78,7 +78,7 @@ public:
         }
         return lines;
     }
-    /// Adds what has come to the checksum, and forgets it.
+    /// Adds the events to the checksum and removes them.
     void takeInto(SampleChecksum& checksum) {
         for (const Event& event : std::exchange(events, {})) {
             std::visit([&](const auto& each) { add(each, checksum); }, event);

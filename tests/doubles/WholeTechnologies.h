@@ -8,7 +8,7 @@
 
 namespace pallax::doubles {
 
-/// The technology of that name on the command line; one without records for those that have none.
+/// The technology of that name on the command line; an empty one for technologies without records.
 inline const WholeTechnology& wholeTechnology(std::string_view commandName) {
     static const WholeTechnology kNone;
     return commandName == "gsm"     ? kWholeGsm

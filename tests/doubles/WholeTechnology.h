@@ -14,16 +14,16 @@ namespace pallax::doubles {
 struct WholeTechnology {
     using Names = std::vector<std::string>;
 
-    /// Who gets the packets of a log code, in call order.
+    /// The subscribers of each log code, in call order.
     std::map<LogCode, Names> subscribers;
-    /// In the order of registration, each with the number of its log codes.
+    /// The sections in the order of registration, with their numbers of log codes.
     std::vector<std::pair<std::string, int>> registration;
-    /// Those that show nothing, whatever the modem sends.
+    /// The sections that never show anything.
     std::set<std::string> alwaysEmpty;
-    /// Those whose log codes are in no simulated drive and no sample.
+    /// The sections whose log codes are in no simulated drive and no sample.
     std::set<std::string> notSimulated = {};
 
-    /// Those that no simulated drive fills.
+    /// The sections that no simulated drive fills.
     std::set<std::string> emptyInDrives() const {
         std::set<std::string> sections = alwaysEmpty;
         sections.insert(notSimulated.begin(), notSimulated.end());

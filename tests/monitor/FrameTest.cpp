@@ -162,7 +162,7 @@ TEST_F(FrameTest, AValueIsAsOldAsItsLatestReading) {
     EXPECT_EQ(age("/A"), 1);
     EXPECT_EQ(age("/"), 1) << "the latest age below";
     EXPECT_EQ(stamp("/C/D").read, std::nullopt);
-    EXPECT_EQ(age("/C/D"), 0) << "since it changed";
+    EXPECT_EQ(age("/C/D"), 0) << "the age of the change";
     ages.note("/A", kFirstTick + seconds(9));
     ages.note("/A/B", kFirstTick + seconds(4));
     show(Dictionary{{"A", Dictionary{{"B", "1"}}}, {"C", Dictionary{{"D", "2"}}}}, 10);

@@ -20,7 +20,7 @@ public:
     std::function<void()> onFrame;
 };
 
-/// A generator that knows when all that it shows was read.
+/// A generator that reports one time of reading for all its values.
 class AgingGenerator final : public FakeGenerator {
 public:
     using FakeGenerator::FakeGenerator;

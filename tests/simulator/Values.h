@@ -43,7 +43,7 @@ inline bool shows(const PropertyList& shown, const PropertyList& expected) {
     return shown == expected;
 }
 
-/// One of a record's labels, with the number that stands for it.
+/// One of a record's labels with its number.
 template <class Number = unsigned>
 struct Labelled {
     Number number;
