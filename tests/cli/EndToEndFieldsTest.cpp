@@ -67,10 +67,11 @@ TEST_F(EndToEnd, EveryValueThatDecodeShowsIsAField) {
         }
         const Run decoded = run({"decode", std::string(PALLAX_SOURCE_DIR "/samples/") + recording});
         std::size_t values = 0;
-        visitValues(nlohmann::json::parse(decoded.out), "", known, [&](const std::string& path) {
-            EXPECT_TRUE(known.contains(path)) << technology << ": " << path;
+        const auto look = [&known, &values, name = technology](const std::string& path) {
+            EXPECT_TRUE(known.contains(path)) << name << ": " << path;
             ++values;
-        });
+        };
+        visitValues(nlohmann::json::parse(decoded.out), "", known, look);
         EXPECT_GT(values, 20U) << technology;
     }
 }

@@ -86,16 +86,16 @@ TEST(LayoutReader, ARecordCutAtAnyLengthGivesItsWholeEntries) {
         all.emplace_back("]");
         return all;
     };
-    for (const std::size_t length : {0, 1, 2, 3}) {
+    for (const std::size_t length : {0U, 1U, 2U, 3U}) {
         EXPECT_EQ(cutTo(length), joined({})) << length;
     }
-    for (const std::size_t length : {4, 5, 6}) {
+    for (const std::size_t length : {4U, 5U, 6U}) {
         EXPECT_EQ(cutTo(length), joined({first})) << length;
     }
-    for (const std::size_t length : {7, 8, 9}) {
+    for (const std::size_t length : {7U, 8U, 9U}) {
         EXPECT_EQ(cutTo(length), joined({first, second})) << length;
     }
-    for (const std::size_t length : {10, 11}) {
+    for (const std::size_t length : {10U, 11U}) {
         EXPECT_EQ(cutTo(length), joined({first, second, third})) << length;
     }
 }

@@ -195,7 +195,7 @@ TEST(LayoutRecord, TheDisplayIsTheSameWhateverTheLogTakes) {
         fixture.record.display().setLate(true);
         const RecordingLog log(threshold);
         for (const std::uint8_t byte : std::array<std::uint8_t, 2>{5, 6}) {
-            for (const LogCode logCode : {100, 200, 300}) {
+            for (const LogCode logCode : {100U, 200U, 300U}) {
                 const ByteBuffer bytes = {byte};
                 fixture.record.updateWithData(LogRecord(bytes), logCode);
             }
