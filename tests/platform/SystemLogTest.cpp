@@ -30,6 +30,7 @@ TEST(SystemLog, WithoutASinkNothingIsEnabled) {
     EXPECT_FALSE(SystemLog::isEnabled(LogPriority::Error));
     EXPECT_FALSE(SystemLog::isEnabled(LogPriority::DlfFailure));
     systemLog(LogPriority::Error, "goes nowhere");
+    SystemLog::write(LogPriority::Error, "dropped");
 }
 
 } // namespace

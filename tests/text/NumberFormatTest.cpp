@@ -2,6 +2,7 @@
 
 #include "tests/doubles/Property.h"
 #include "text/Format.h"
+#include "text/Text.h"
 
 #include <gtest/gtest.h>
 
@@ -35,6 +36,7 @@ TEST(NumberFormat, TextsAreThoseOfPrintf) {
     EXPECT_EQ(DisplayNumber(std::int64_t{-98}, kDbm).text(), "-98 dBm");
     EXPECT_EQ(DisplayNumber(-140.0, kLevel).text(), "-140.00 dBm");
     EXPECT_EQ(DisplayNumber(1.0, kLevel).text(), "1.00 dBm");
+    EXPECT_EQ(DisplayNumber(std::int64_t{1}, kLevel).text(), "1.00 dBm");
     EXPECT_EQ(DisplayNumber(-7.5, kSix).text(), "-7.500000 dB");
     EXPECT_EQ(DisplayNumber(0.0, kSigned).text(), "+0.00 dB");
     EXPECT_EQ(DisplayNumber(63.4951, kPercent).text(), "63.50%");
@@ -99,6 +101,15 @@ TEST(FormatText, TakesTheConversionsOfLogTexts) {
     EXPECT_EQ(formatText("%c%c%c", {'3', '1', '0'}), "310");
     EXPECT_EQ(formatText("%05d|%-5d|% d", {42, 42, 42}), "00042|42   | 42");
     EXPECT_EQ(formatText("%X %#x", {255, 255}), "FF 0xff");
+    EXPECT_EQ(formatText("%.4d|%6.4d|%.3s", {-42, 42, "serving"}), "-0042|  0042|ser");
+    EXPECT_EQ(formatText("%.1f", {3}), "3.0");
+    EXPECT_EQ(formatText("%@", {Text("serving")}), "serving");
+}
+
+TEST(FormatText, RefusesOtherConversions) {
+    EXPECT_THROW((void)formatText("%q", {1}), std::invalid_argument);
+    EXPECT_THROW((void)formatText("%401d", {1}), std::invalid_argument);
+    EXPECT_EQ(formatText("%400d", {1}), std::string(399, ' ') + "1");
 }
 
 TEST(FormatText, AnArgumentPrintsAsWhatItIs) {
