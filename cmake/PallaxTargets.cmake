@@ -52,19 +52,25 @@ endfunction()
 # compile; the tests around it would only take longer to build.
 set(pallax_library_level $<$<CONFIG:Debug>:-O1>)
 
-# Parsing these headers takes most of the time of compiling a source. The preset "core" builds
-# without them: a source of the core with a missing include fails there.
-if(PALLAX_PRECOMPILE)
+# pallax_precompile(NAME header...): the headers whose parsing takes most of the time of compiling a
+# source. The preset "core" builds without them: a source of the core with a missing include fails
+# there.
+function(pallax_precompile name)
+    if(NOT PALLAX_PRECOMPILE)
+        return()
+    endif()
     file(WRITE ${PROJECT_BINARY_DIR}/precompiled.cpp "")
-    add_library(pallax_precompiled STATIC ${PROJECT_BINARY_DIR}/precompiled.cpp)
-    target_link_libraries(pallax_precompiled PUBLIC pallax_options)
-    target_precompile_headers(pallax_precompiled PRIVATE
+    add_library(${name} STATIC ${PROJECT_BINARY_DIR}/precompiled.cpp)
+    target_link_libraries(${name} PUBLIC pallax_options)
+    target_precompile_headers(${name} PRIVATE
         <algorithm> <array> <chrono> <cmath> <cstdint> <functional> <map> <memory>
-        <optional> <span> <stdexcept> <string> <string_view> <variant> <vector>
+        <optional> <span> <stdexcept> <string> <string_view> <variant> <vector> ${ARGN}
     )
-    pallax_instrument_for_fuzzing(pallax_precompiled)
-    target_compile_options(pallax_precompiled PRIVATE ${pallax_library_level})
-endif()
+    pallax_instrument_for_fuzzing(${name})
+    target_compile_options(${name} PRIVATE ${pallax_library_level})
+endfunction()
+pallax_precompile(pallax_precompiled)
+set(pallax_precompiled pallax_precompiled) # for the libraries of a folder and those below
 
 # pallax_library(NAME SOURCES file... [LINKS library...])
 # One static library for a folder, linking only the folders below it.
@@ -75,7 +81,7 @@ function(pallax_library name)
     pallax_instrument_for_fuzzing(${name})
     target_compile_options(${name} PRIVATE ${pallax_library_level})
     if(PALLAX_PRECOMPILE)
-        target_precompile_headers(${name} REUSE_FROM pallax_precompiled)
+        target_precompile_headers(${name} REUSE_FROM ${pallax_precompiled})
     endif()
 endfunction()
 
