@@ -133,7 +133,7 @@ void decodeSamples(const std::string& path, SampleSink& sink, const AfterPacket&
     }
     RecordingDecoder decoder({resources, bundle, notices, technologies()},
                              (*recording)->technology()->identifier, Every::End, displays);
-    decoder.setSampleSink(&sink);
+    decoder.addSampleSink(sink);
     while (const auto packet = (*recording)->next()) {
         (void)decoder.add(*packet);
         afterPacket();

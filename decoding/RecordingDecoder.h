@@ -50,9 +50,8 @@ public:
     /// False when no generator knows the technology; then there is nothing else to do.
     bool hasGenerator() const { return _driver.generator() != nullptr; }
 
-    /// Gives the samples of later packets to `sink`, too, until it is null. The sink outlives the
-    /// decoder, or is taken away.
-    void setSampleSink(SampleSink* sink) { _driver.setSampleSink(sink); }
+    /// Also gives the samples of later packets to `sink`, which must outlive the decoder.
+    void addSampleSink(SampleSink& sink) { _driver.addSampleSink(sink); }
 
     /// If a record has thrown, the reason why the packet was dropped. TemplateFailure propagates.
     std::optional<std::string> add(const RecordedPacket& packet);

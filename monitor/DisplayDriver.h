@@ -1,7 +1,7 @@
 #pragma once
 
 #include "LogGenerator/LogGenerator.h"
-#include "LogGenerator/Records/Sample.h"
+#include "LogGenerator/Records/SampleFanOut.h"
 #include "plist/PropertyList.h"
 
 #include <memory>
@@ -18,15 +18,17 @@ public:
     void setGenerator(std::unique_ptr<LogGenerator> generator) {
         (void)display();
         _generator = std::move(generator);
-        setSampleSink(_sink);
+        handOutSink();
     }
-    /// Also gives the samples of later packets to `sink`; null stops it. The sink must outlive the
-    /// driver or be removed first.
-    void setSampleSink(SampleSink* sink) {
-        _sink = sink;
-        if (_generator) {
-            _generator->setSampleSink(sink);
-        }
+    /// Also gives the samples of later packets to `sink`, which must outlive the driver or be
+    /// removed first. Neither between a packet's begin and end.
+    void addSampleSink(SampleSink& sink) {
+        _sinks.add(sink);
+        handOutSink();
+    }
+    void removeSampleSink(const SampleSink& sink) {
+        _sinks.remove(sink);
+        handOutSink();
     }
     const LogGenerator* generator() const { return _generator.get(); }
     /// True when the generator cannot update the display that an earlier one left.
@@ -36,17 +38,18 @@ public:
     /// even if it is not read. Exceptions of records pass through, and the packet then does not
     /// count as new data.
     void update(Bytes packet, const SamplePacket& origin = {}) {
-        if (_sink == nullptr) {
+        SampleSink* sink = _sinks.sink();
+        if (sink == nullptr) {
             return updateState(packet);
         }
-        _sink->beginPacket(origin);
+        sink->beginPacket(origin);
         try {
             updateState(packet);
         } catch (...) {
-            _sink->endPacket();
+            sink->endPacket();
             throw;
         }
-        _sink->endPacket();
+        sink->endPacket();
     }
     /// Called at a display tick: whether packets have arrived since the last one.
     bool takeUpdated() { return std::exchange(_updated, false); }
@@ -67,6 +70,11 @@ public:
     }
 
 private:
+    void handOutSink() {
+        if (_generator) {
+            _generator->setSampleSink(_sinks.sink());
+        }
+    }
     void updateState(Bytes packet) {
         if (_generator) {
             _generator->updateState(_state, packet);
@@ -76,7 +84,7 @@ private:
 
     std::unique_ptr<LogGenerator> _generator; // destroyed after the state
     Dictionary _state;
-    SampleSink* _sink = nullptr;
+    SampleFanOut _sinks;
     bool _updated = false;
 };
 

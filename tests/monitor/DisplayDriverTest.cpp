@@ -129,30 +129,43 @@ protected:
 
 TEST_F(SampledDriverTest, EachPacketOfTheSinkBeginsAndEnds) {
     setSampledGenerator();
-    driver.setSampleSink(&recorder);
+    driver.addSampleSink(recorder);
     EXPECT_EQ(samplesOf(7), (Lines{"packet 7", "removed in the packet", "end of packet"}));
     EXPECT_EQ(samplesOf(8), (Lines{"packet 8", "removed in the packet", "end of packet"}));
-    driver.setSampleSink(nullptr);
+    driver.removeSampleSink(recorder);
     EXPECT_EQ(samplesOf(9), Lines{});
+}
+
+TEST_F(SampledDriverTest, EverySinkGetsAllUntilItIsRemoved) {
+    setSampledGenerator();
+    doubles::SampleRecorder second;
+    driver.addSampleSink(recorder);
+    driver.addSampleSink(second);
+    const Lines packet = {"packet 7", "removed in the packet", "end of packet"};
+    EXPECT_EQ(samplesOf(7), packet);
+    EXPECT_EQ(second.takeLines(), packet);
+    driver.removeSampleSink(recorder);
+    EXPECT_EQ(samplesOf(8), Lines{});
+    EXPECT_EQ(second.takeLines(), (Lines{"packet 8", "removed in the packet", "end of packet"}));
 }
 
 TEST_F(SampledDriverTest, APacketWhoseRecordThrowsEndsToo) {
     setSampledGenerator().refusePackets = true;
-    driver.setSampleSink(&recorder);
+    driver.addSampleSink(recorder);
     EXPECT_THROW(driver.update({}), std::runtime_error);
     EXPECT_EQ(recorder.takeLines(), (Lines{"packet 0", "removed in the packet", "end of packet"}));
     EXPECT_FALSE(driver.takeUpdated());
 }
 
 TEST_F(SampledDriverTest, WithoutAGeneratorPacketsAreEmpty) {
-    driver.setSampleSink(&recorder);
+    driver.addSampleSink(recorder);
     EXPECT_EQ(samplesOf(1), (Lines{"packet 1", "end of packet"}));
 }
 
 TEST_F(SampledDriverTest, AGeneratorThatIsSetLaterGetsTheSink) {
-    driver.setSampleSink(&recorder);
+    driver.addSampleSink(recorder);
     EXPECT_EQ(setSampledGenerator().samples, &recorder);
-    driver.setSampleSink(nullptr);
+    driver.removeSampleSink(recorder);
     EXPECT_EQ(setSampledGenerator().samples, nullptr);
 }
 

@@ -169,7 +169,7 @@ TEST(Samples, PathsBeyondTheMostAreLeftOut) {
 
 TEST(Samples, APacketEndsAlsoWhereARecordThrows) {
     TechnologyDriver gsm("Zorell_GSM");
-    gsm.driver.setSampleSink(&gsm.recorder);
+    gsm.driver.addSampleSink(gsm.recorder);
     EXPECT_THROW(gsm.update(Record(kSimFilesLogCode).u8(1).bytes()), std::exception);
     EXPECT_EQ(gsm.recorder.takeLines(), (Events{"packet 1", "section SIM Info", "end of packet"}));
 }
@@ -193,12 +193,14 @@ std::string withoutAddresses(const std::string& line) {
     return address == std::string::npos ? line : line.substr(0, address);
 }
 
-Decoded decode(const std::string& path, SampleSink* sink) {
+Decoded decode(const std::string& path, const std::vector<SampleSink*>& sinks) {
     const auto recording = Recording::open(path);
     EXPECT_TRUE(recording) << path;
     RecordingLog log;
     TechnologyDriver technology((*recording)->technology()->identifier);
-    technology.driver.setSampleSink(sink);
+    for (SampleSink* sink : sinks) {
+        technology.driver.addSampleSink(*sink);
+    }
     Decoded decoded;
     for (std::size_t number = 1; const auto packet = (*recording)->next(); ++number) {
         technology.clock().set(packet->time);
@@ -220,17 +222,23 @@ Decoded decode(const std::string& path, SampleSink* sink) {
     return decoded;
 }
 
-TEST(Samples, ASinkChangesNeitherLogNorDisplay) {
+TEST(Samples, AnyNumberOfSinksChangesNeitherLogNorDisplay) {
     for (const char* name :
          {"cdma-drive", "gsm-attach", "ifx-stream", "lte-drive", "umts-drive", "utran-drive"}) {
         const std::string path = std::string(PALLAX_SOURCE_DIR "/samples/") + name + ".pcap";
-        doubles::SampleRecorder recorder;
-        const Decoded with = decode(path, &recorder);
-        const Decoded without = decode(path, nullptr);
-        EXPECT_EQ(with.log, without.log) << name;
-        EXPECT_EQ(with.saved, without.saved) << name;
-        EXPECT_EQ(with.failures, without.failures) << name;
-        EXPECT_GT(recorder.takeLines().size(), 100U) << name;
+        const Decoded without = decode(path, {});
+        doubles::SampleRecorder alone;
+        doubles::SampleRecorder first;
+        doubles::SampleRecorder second;
+        for (const Decoded& with : {decode(path, {&alone}), decode(path, {&first, &second})}) {
+            EXPECT_EQ(with.log, without.log) << name;
+            EXPECT_EQ(with.saved, without.saved) << name;
+            EXPECT_EQ(with.failures, without.failures) << name;
+        }
+        const Events samples = alone.takeLines();
+        EXPECT_GT(samples.size(), 100U) << name;
+        EXPECT_EQ(first.takeLines(), samples) << name;
+        EXPECT_EQ(second.takeLines(), samples) << name;
     }
 }
 

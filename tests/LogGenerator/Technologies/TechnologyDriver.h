@@ -32,9 +32,9 @@ public:
     }
     /// What a sink is given for one packet.
     std::vector<std::string> samplesOf(const ByteBuffer& packet) {
-        driver.setSampleSink(&recorder);
+        driver.addSampleSink(recorder);
         update(packet);
-        driver.setSampleSink(nullptr);
+        driver.removeSampleSink(recorder);
         return recorder.takeLines();
     }
     std::vector<std::string> samplesOf(const doubles::Record& record) {
