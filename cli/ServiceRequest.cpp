@@ -93,7 +93,8 @@ ParsedOptions serviceOptions(const ServiceRequest& request) {
     if (request.status) {
         return ServiceStatusOptions();
     }
-    if (std::holds_alternative<ServiceModem>(request.options.source)) {
+    const Source& source = request.options.source;
+    if (std::holds_alternative<ServiceModem>(source) || recordingPath(source) == "") {
         return wrongUsage("the service needs --play, --simulate, --relay or --status", "service");
     }
     return request.options;

@@ -12,6 +12,7 @@
 #include <csignal>
 #include <cstring>
 #include <fcntl.h>
+#include <poll.h>
 #include <span>
 #include <sys/prctl.h>
 #include <sys/wait.h>
@@ -44,27 +45,40 @@ Pipe makePipe() {
     return {Descriptor(ends[0]), Descriptor(ends[1])};
 }
 
-std::string readToEnd(const Descriptor& descriptor) {
-    std::string text;
+/// Appends what is there; false at the end.
+bool readPiece(const Descriptor& descriptor, std::string& text) {
     std::array<char, 1024> piece{};
-    for (;;) {
-        const ssize_t count = ::read(descriptor.number(), piece.data(), piece.size());
-        if (count > 0) {
-            text.append(piece.data(), static_cast<std::size_t>(count));
-        } else if (count == 0 || errno != EINTR) {
-            return text;
-        }
+    const ssize_t count = ::read(descriptor.number(), piece.data(), piece.size());
+    if (count > 0) {
+        text.append(piece.data(), static_cast<std::size_t>(count));
     }
+    return count > 0 || (count < 0 && errno == EINTR);
 }
 
-/// True when the child reports that it is ready; false if it ends before.
-bool waitUntilReady(const Descriptor& ready) {
-    char sign = 0;
-    ssize_t count = 0;
-    do {
-        count = ::read(ready.number(), &sign, 1);
-    } while (count < 0 && errno == EINTR);
-    return count == 1;
+std::string readToEnd(const Descriptor& descriptor) {
+    std::string text;
+    while (readPiece(descriptor, text)) {
+    }
+    return text;
+}
+
+/// True when the child reports that it is ready; false if it ends before. Meanwhile its complaints
+/// are read: a pipe holds 64 KiB, and a child that waits for room would never end.
+bool waitUntilReady(const Descriptor& ready, const Descriptor& complaints, std::string& told) {
+    std::array<pollfd, 2> watched{{{ready.number(), POLLIN, 0}, {complaints.number(), POLLIN, 0}}};
+    auto& [readiness, complaint] = watched;
+    std::string sign;
+    for (;;) {
+        if (::poll(watched.data(), watched.size(), -1) < 0) {
+            continue; // a signal has come
+        }
+        if (complaint.revents != 0 && !readPiece(complaints, told)) {
+            complaint.fd = -1; // no more will come
+        }
+        if (readiness.revents != 0 && (!readPiece(ready, sign) || !sign.empty())) {
+            return !sign.empty();
+        }
+    }
 }
 
 std::vector<std::string> argumentsFor(const ServiceOptions& options) {
@@ -204,10 +218,12 @@ Result<std::unique_ptr<ChildService>, HostError> ChildService::start(ServiceOpti
     complaints.write.reset();
     std::unique_ptr<ChildService> service(
         new ChildService(suffix, process, std::move(complaints.read)));
-    if (waitUntilReady(ready.read)) {
+    std::string complaint;
+    if (waitUntilReady(ready.read, service->_complaints, complaint)) {
+        service->_told = std::move(complaint);
         return service;
     }
-    return HostError{sentenceOf(readToEnd(service->_complaints))};
+    return HostError{sentenceOf(complaint + readToEnd(service->_complaints))};
 }
 
 ChildService::ChildService(std::string suffix, pid_t process, Descriptor complaints)
@@ -235,7 +251,7 @@ void ChildService::stop() {
 std::string ChildService::takeComplaints() {
     const int flags = ::fcntl(_complaints.number(), F_GETFL);
     (void)::fcntl(_complaints.number(), F_SETFL, flags | O_NONBLOCK);
-    return readToEnd(_complaints);
+    return std::exchange(_told, {}) + readToEnd(_complaints);
 }
 
 int runChildService(int argc, char** argv) {

@@ -37,7 +37,7 @@ public:
 
     /// Ends the child and removes files that it left. The second call does nothing.
     void stop();
-    /// The child's messages since it was ready, line by line.
+    /// The child's messages since the last call, line by line.
     std::string takeComplaints();
 
 private:
@@ -47,6 +47,7 @@ private:
     std::string _controlPortName;
     pid_t _process; // 0 once it has ended
     Descriptor _complaints;
+    std::string _told; ///< complaints from before the child was ready
 };
 
 /// The child's side: runs the service described by the arguments after kChildServiceCommand.

@@ -217,6 +217,9 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
               "pallax: --seconds requires --simulate (see pallax service --help)\n");
     EXPECT_EQ(sentence({"service", "--relay", "-", "--speed", "2"}),
               "pallax: --speed excludes --relay (see pallax service --help)\n");
+    EXPECT_EQ(sentence({"service", "--play", ""}),
+              "pallax: the service needs --play, --simulate, --relay or --status (see pallax "
+              "service --help)\n");
     EXPECT_EQ(sentence({"service", "--speed", "2"}),
               "pallax: the service needs --play, --simulate, --relay or --status (see pallax "
               "service --help)\n");

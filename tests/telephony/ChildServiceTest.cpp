@@ -97,6 +97,11 @@ TEST_F(ChildServiceTest, AFailureIsTheChildsOwnSentence) {
     EXPECT_EQ(::waitpid(-1, nullptr, WNOHANG), -1);
 }
 
+TEST_F(ChildServiceTest, AFailureMayBeLongerThanAPipeHolds) {
+    const std::string name(70'000, 'a');
+    EXPECT_EQ(failure(name), name + " cannot be opened: File name too long.");
+}
+
 TEST_F(ChildServiceTest, WhatAKilledChildLeavesIsRemoved) {
     const auto service = start(recordLte(_folder, 1));
     ASSERT_EQ(::kill(service->processId(), SIGKILL), 0);
