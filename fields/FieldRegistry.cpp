@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <set>
 #include <tuple>
 #include <utility>
 
@@ -19,7 +20,7 @@ std::pair<double, double> rawRange(const Position& position) {
 }
 
 double shownNumber(const Conversion& conversion, double raw) {
-    const double number = raw * conversion.factor + conversion.offset;
+    const double number = raw * conversion.factor / conversion.divisor + conversion.offset;
     return conversion.format->isReal() ? number : std::trunc(number);
 }
 
@@ -40,18 +41,35 @@ FieldInfo::Kind kindOf(const FieldDescription& field) {
     return field.position ? FieldInfo::Kind::Label : FieldInfo::Kind::Text;
 }
 
-/// Adds a row to its field.
-void addRow(FieldInfo& info, const FieldDescription& field, LogCode logCode) {
+/// What the numbers of a field have in common, over all its rows.
+struct Numbers {
+    std::set<std::string_view> units;
+    bool areLimited = true;
+};
+
+void addNumber(FieldInfo& info, Numbers& numbers, const FieldDescription& field) {
     const Conversion& conversion = field.shownAs;
-    if (info.unit.empty() && conversion.format != nullptr) {
-        info.unit = conversion.format->unit();
+    numbers.units.insert(conversion.format->unit());
+    // Values that come in different units, each with its own in the text, have none in common.
+    info.unit = numbers.units.size() == 1 ? conversion.format->unit() : std::string_view();
+    numbers.areLimited = numbers.areLimited && field.position.has_value();
+    if (!numbers.areLimited) {
+        info.least.reset();
+        info.most.reset();
+        return;
     }
-    if (conversion.format != nullptr && field.position) {
-        const auto [rawLeast, rawMost] = rawRange(*field.position);
-        const double least = shownNumber(conversion, rawLeast);
-        const double most = shownNumber(conversion, rawMost);
-        info.least = std::min({least, most, info.least.value_or(least)});
-        info.most = std::max({least, most, info.most.value_or(most)});
+    const auto [rawLeast, rawMost] = rawRange(*field.position);
+    const double least = shownNumber(conversion, rawLeast);
+    const double most = shownNumber(conversion, rawMost);
+    info.least = std::min({least, most, info.least.value_or(least)});
+    info.most = std::max({least, most, info.most.value_or(most)});
+}
+
+/// Adds a row to its field.
+void addRow(FieldInfo& info, Numbers& numbers, const FieldDescription& field, LogCode logCode) {
+    const Conversion& conversion = field.shownAs;
+    if (conversion.format != nullptr) {
+        addNumber(info, numbers, field);
     }
     for (const std::string_view label : conversion.labels) {
         addLabel(info.labels, label);
@@ -113,7 +131,8 @@ private:
     void addParts(const std::vector<FieldDescription>& fields,
                   const std::vector<ListDescription>& lists, LogCode logCode) {
         for (const FieldDescription& field : fields) {
-            addRow(infoOf(field.key, kindOf(field)), field, logCode);
+            FieldInfo& info = infoOf(field.key, kindOf(field));
+            addRow(info, _numbers[info.name], field, logCode);
         }
         for (const ListDescription& list : lists) {
             addList(list, logCode);
@@ -196,6 +215,7 @@ private:
     }
 
     const TechnologyReference& _technology;
+    std::map<std::string, Numbers> _numbers; ///< by the field's name
     std::string _prefix;
     std::vector<FieldInfo> _fields;
     const SectionReference* _section = nullptr;

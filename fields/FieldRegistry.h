@@ -31,7 +31,7 @@ struct FieldInfo {
     std::string section;
     std::string key; ///< empty if an entry of the list is the value itself
     Kind kind = Kind::Number;
-    std::string unit;
+    std::string unit; ///< empty if values come without one, or in several
     /// The range of the shown number; nothing if the layout does not limit it.
     std::optional<double> least;
     std::optional<double> most;

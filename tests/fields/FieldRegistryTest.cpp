@@ -47,6 +47,24 @@ Identities identitiesIn(std::string_view commandName) {
     return identities;
 }
 
+TEST(FieldRegistry, AFieldThatComesInSeveralWaysHasWhatTheyHaveInCommon) {
+    const FieldRegistry registry = registryOf("gsm");
+    // One log code tells the level as a byte, the cell monitor as any number of dBm.
+    const FieldInfo* level = registry.named("gsm.neighboring_cells.rssi");
+    ASSERT_NE(level, nullptr);
+    EXPECT_EQ(level->unit, "");
+    EXPECT_EQ(level->least, std::nullopt);
+    EXPECT_EQ(level->most, std::nullopt);
+}
+
+TEST(FieldRegistry, ARangeIsOfTheNumbersThatAreShown) {
+    const FieldRegistry registry = registryOf("cdma");
+    const FieldInfo* gain = registry.named("cdma.1x.transmit_agc");
+    ASSERT_NE(gain, nullptr);
+    EXPECT_EQ(gain->least, -3276.8) << "tenths of 16 bits";
+    EXPECT_EQ(gain->most, 3276.7);
+}
+
 TEST(FieldRegistry, KnowsAFieldOfASection) {
     const FieldRegistry registry = registryOf("lte");
     const FieldInfo* field = registry.named("lte.serving_cell_measurements.measured_rsrp");
