@@ -14,8 +14,8 @@ namespace pallax {
 /// Compares each display with the one before, leaf by leaf, in display order.
 class DisplayDifference {
 public:
-    /// A leaf of the display tree. `written` belongs to whoever listens: it stays with the leaf
-    /// from display to display.
+    /// A leaf of the display tree. The listener owns `written`, which is kept from display to
+    /// display.
     struct Leaf {
         PropertyList value;
         std::string written;

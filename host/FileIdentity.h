@@ -6,7 +6,7 @@
 
 namespace pallax {
 
-/// Which file something is, whatever its names.
+/// Identifies a file independently of its names.
 struct FileIdentity {
     dev_t device = 0;
     ino_t inode = 0;

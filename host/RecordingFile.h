@@ -19,7 +19,7 @@ struct RecordingFile {
     static bool isStream(const std::string& path);
 
     /// Opens a path (not "-"). For a stream, returns once there is data to read, or its end;
-    /// `waiting`, if any, is told that there is no writer yet.
+    /// `waiting` (may be empty) gets a sentence while there is no writer.
     static Result<RecordingFile, RecordingError>
     open(const std::string& path, const Recording::Waiting& waiting,
          std::chrono::milliseconds patience = kPatience);

@@ -17,9 +17,9 @@ namespace pallax {
 /// The clock and the timers of a program that watches a source.
 ///
 /// A played source (a recording, a simulation) sets the time: its stamps determine the display
-/// ticks, whatever the machine's load or the playing speed, so the same recording gives the same
-/// ticks. A timer's ticks lie on a grid: the first source time plus whole intervals. Before the
-/// clock reaches a time, it runs the ticks up to and including it, each timer at most once, for its
+/// ticks, so the same recording gives the same ticks at any load and playing speed. A
+/// timer's ticks lie on a grid: the first source time plus whole intervals. Before the clock
+/// reaches a time, it runs the ticks up to and including it, each timer at most once, for its
 /// earliest tick; it skips the other ticks of a gap. During a tick, `now` is the tick's time. When
 /// the stamps step back (StampSequence), each timer runs its next tick and gets a grid that starts
 /// there. If the source is silent for kSilence, the timers follow the wall clock, and the clock

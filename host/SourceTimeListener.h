@@ -11,8 +11,8 @@ namespace pallax {
 class SourceTimeListener {
 public:
     virtual ~SourceTimeListener() = default;
-    /// A new connection starts to send times, which need not follow the earlier ones. The times of
-    /// a live source are its stamps and do not affect the present.
+    /// A new connection starts to send times; they may be earlier than the previous ones. The times
+    /// of a live source are its stamps and do not affect the present.
     virtual void sourceBegan(bool isLive) = 0;
     /// One step towards `time`. True: a tick before `time` was due and has run; blocks that it
     /// posted on the main queue come first, then call this again from a later block. False: the

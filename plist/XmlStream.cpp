@@ -18,7 +18,7 @@ constexpr std::string_view kOpening = "<?xml version=\"1.0\" encoding=\"UTF-8\"?
                                       "<plist version=\"1.0\">\n";
 constexpr std::string_view kClosing = "</plist>\n";
 
-/// What stands in XML as it is, whatever comes before and after it.
+/// Characters that XML never needs escaped.
 constexpr auto kPlain = [] {
     std::array<bool, 256> plain{};
     for (unsigned char letter = ' '; letter <= '~'; ++letter) {

@@ -7,7 +7,7 @@
 
 namespace pallax {
 
-/// Writes an XML property list as it is told, element by element: no object is built. Internal to
+/// Writes an XML property list element by element, without building an object. Internal to
 /// the codec and the simulator; throws a Refusal for what `serializeXml` refuses.
 class XmlStream {
 public:

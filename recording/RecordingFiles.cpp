@@ -104,7 +104,7 @@ std::optional<HostError> RecordingFiles::makeRoom(const RecordedTechnology& tech
     return _file->begin(technology.linkType, technology.identifier);
 }
 
-/// A file without packets takes the next one, whatever the limits are.
+/// An empty file takes the next packet even if it exceeds the limits.
 bool RecordingFiles::isFull(Time time, std::size_t length) const {
     if (_stamps.isEmpty()) {
         return false;

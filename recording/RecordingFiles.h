@@ -37,7 +37,7 @@ public:
     static constexpr unsigned kMostParts = 9999;
 
     /// Opens the first file. Fails if it exists and must be kept, or if files rotate but the path
-    /// is not a file. `notice` is told when a new technology starts a file.
+    /// is not a file. `notice` gets a sentence when a new technology starts a file.
     static Result<std::unique_ptr<RecordingFiles>, HostError> open(const Options& options,
                                                                    Notice notice = {});
 

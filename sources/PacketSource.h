@@ -38,8 +38,8 @@ public:
     virtual ~PacketSource() = default;
     /// The answer to GetTechnology.
     virtual std::string technology() const = 0;
-    /// Tells which log codes are wanted from now on. A modem need not send others; a recording
-    /// gives every packet, since all their times count.
+    /// From now on, packets with other log codes may be left out. A recording still gives all of
+    /// them, because the player needs their times.
     virtual void select(const CodeFilter& /*wanted*/) {}
     virtual Next next() = 0;
     /// After Later: calls `ready` once, as a block of the main queue, when `next` has a new result.

@@ -95,7 +95,7 @@ PacketPlayer::Progress PacketPlayer::fetch() {
     return Progress::Go;
 }
 
-/// Takes the next packet's stamp; a receiver is told about it even if it does not get the packet.
+/// Takes the next packet's stamp. The receiver gets remarks about it even if not the packet.
 void PacketPlayer::followStamp() {
     const bool isFirst = _stamps.isEmpty();
     if (!_setup.options.live) {

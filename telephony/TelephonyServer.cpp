@@ -78,14 +78,13 @@ LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
     do { // an earlier service may still be ending
         portName = formatText("%@%@%d", {_setup.controlPortName, kChannelSuffix, ++_latestNumber});
     } while (_setup.ports.isTaken(portName));
-    const int number = _latestNumber;
+    const auto remove = [this, number = _latestNumber] { removeChannel(number); };
     std::unique_ptr<ServedChannel> channel;
     const int error = ServedChannel::open(
         ServedChannel::Setup{_setup.queue, _setup.ports, portName, localPortName,
                              std::move(source).value(), _setup.options, _setup.mostWaiting,
-                             [this](const std::string& sentence) { report(sentence); },
-                             [this, number] { removeChannel(number); },
-                             [this, number] { removeChannel(number); },
+                             [this](const std::string& sentence) { report(sentence); }, remove,
+                             remove,
                              [this](const std::string& failure) {
                                  if (!failure.empty()) {
                                      report(failure);
@@ -95,7 +94,7 @@ LogChannel TelephonyServer::createLogChannel(const std::string& localPortName) {
     if (error != 0) {
         return {kServiceErrorDomain, error, {}};
     }
-    _channels.emplace(number, Channel{std::move(channel), _setup.steadyNow()});
+    _channels.emplace(_latestNumber, Channel{std::move(channel), _setup.steadyNow()});
     return {0, 0, std::move(portName)};
 }
 

@@ -54,8 +54,8 @@ private:
     Nodes _nodes{&_storage};
 };
 
-/// A named node of the display tree; immutable. A node is a branch if `childNodes` is not null,
-/// whatever its class.
+/// A named node of the display tree; immutable. A node of any class is a branch if `childNodes`
+/// is not null.
 class PallaxModelNode {
 public:
     /// A name that may be shared, usually with the key in the display. Never null.

@@ -11,8 +11,8 @@
 
 namespace pallax::ifx {
 
-/// Writes a message in the binary form as it is told: no object is built. First come all words,
-/// then the other texts, and each container after what it holds.
+/// Writes a message in the binary form without building an object. First come all words, then
+/// the other texts, and each container after what it holds.
 class BinaryMessage {
 public:
     BinaryMessage();

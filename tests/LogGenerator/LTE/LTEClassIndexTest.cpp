@@ -32,7 +32,7 @@ TEST_F(LTEClassIndexTest, TheDisplayHoldsExactlyTheSectionsInTheOrderOfTheTempla
                           doubles::propertyListFile(PALLAX_SOURCE_DIR "/resources/LTE.plist"));
     const auto generator = LTELogGenerator::generator(fixture.environment());
     Dictionary state;
-    generator->updateState(state, doubles::Record(0x1234).padTo(200).bytes()); // nobody's
+    generator->updateState(state, doubles::Record(0x1234).padTo(200).bytes()); // no record reads it
     doubles::expectInOrder(
         *state.find("Display"),
         Dictionary{{"Serving Cell Info", Dictionary()},
