@@ -91,10 +91,11 @@ std::uint64_t decode(const std::string& path, Every every, DecodeFormat format) 
 class ChecksumSink final : public SampleSink {
 public:
     void sample(const Sample& sample) override {
-        const DisplayNumber* number = sample.value.number();
-        _checksum.sample(sample.id, sample.raw,
-                         number != nullptr ? doubles::SampleChecksum::of(*number)
-                                           : checksumOfWords(sample.value));
+        if (const DisplayNumber* number = sample.value.number()) {
+            _checksum.sample(sample.id, sample.raw, doubles::SampleChecksum::of(*number));
+        } else {
+            addWords(sample);
+        }
     }
     void keyRemoved(std::string_view key) override { _checksum.key(key); }
     void beginList(const SampleList& list) override { _checksum.key(list.key); }
@@ -106,7 +107,10 @@ public:
 
 private:
     /// Apart, so that the numbers, which are most of the samples, do not pay for the texts.
-    [[gnu::noinline]] static std::uint64_t checksumOfWords(const SampleValue& value) {
+    [[gnu::noinline]] void addWords(const Sample& sample) {
+        _checksum.sample(sample.id, sample.raw, checksumOfWords(sample.value));
+    }
+    static std::uint64_t checksumOfWords(const SampleValue& value) {
         if (const PropertyList* object = value.object()) {
             return doubles::SampleChecksum::of(object->string().value_or(object->description()));
         }

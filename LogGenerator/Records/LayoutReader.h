@@ -71,29 +71,32 @@ private:
     void readFields(const LogRecord& place, std::span<const Field> fields) {
         FieldId id = _next;
         for (const Field& field : fields) {
-            if (field.condition == nullptr && field.computation == nullptr) {
-                const std::int64_t raw = place.read(*field.position);
-                give(field, id, raw, field.conversion.valueOf(raw));
-            } else {
-                readSpecial(field, id, place);
+            if (field.condition == nullptr || allows(field, id, place)) {
+                if (field.computation == nullptr) {
+                    const std::int64_t raw = place.read(*field.position);
+                    give(field, id, raw, field.conversion.valueOf(raw));
+                } else {
+                    compute(field, id, place);
+                }
             }
             ++id;
         }
         _next = id;
     }
 
-    /// Not inlined, because it is rare and would slow the loop down.
-    [[gnu::noinline]] void readSpecial(const Field& field, FieldId id, const LogRecord& place) {
-        if (field.condition != nullptr) {
-            const std::int64_t number = numberOf(*field.condition, place);
-            if (!field.condition->holdsFor(number)) {
-                return giveOtherwise(field, id, number);
-            }
+    // The next two are not inlined, because they are rare and would slow the loop down.
+
+    /// Whether the field's condition holds. If not, gives what is shown instead.
+    [[gnu::noinline]] bool allows(const Field& field, FieldId id, const LogRecord& place) {
+        const std::int64_t number = numberOf(*field.condition, place);
+        const bool holds = field.condition->holdsFor(number);
+        if (!holds) {
+            giveOtherwise(field, id, number);
         }
-        if (field.computation == nullptr) {
-            const std::int64_t raw = place.read(*field.position);
-            return give(field, id, raw, field.conversion.valueOf(raw));
-        }
+        return holds;
+    }
+
+    [[gnu::noinline]] void compute(const Field& field, FieldId id, const LogRecord& place) {
         _place.here = place;
         _place.memory = &_memory;
         const PropertyList value = field.computation->compute(_place);
@@ -140,7 +143,7 @@ private:
         const EntryList companions =
             list.companion ? EntryList(place, list.companion->layoutIn(place), entries.count())
                            : EntryList({}, {}, 0);
-        const bool mayBeLonger = hasConditions(list);
+        const bool mayBeLonger = hasLongerEntries(list);
         _sink.beginList({list.key, &list, whole});
         for (std::size_t index = 0; index < whole; ++index) {
             const LogRecord entry = entries.at(index);
@@ -168,9 +171,17 @@ private:
         _sink.endList();
     }
 
-    static bool hasConditions(const ListLayout& list) {
-        return std::any_of(list.fields.begin(), list.fields.end(),
-                           [](const Field& field) { return field.condition != nullptr; });
+    /// Whether a field that depends on a condition may lie after the bytes that make an entry
+    /// whole.
+    static bool hasLongerEntries(const ListLayout& list) {
+        return std::any_of(list.fields.begin(), list.fields.end(), [&list](const Field& field) {
+            return field.condition != nullptr && field.position &&
+                   endOf(*field.position) > list.entries.layout.bytesRead;
+        });
+    }
+    static std::size_t endOf(const Position& position) {
+        const Extent extent = extentOf(position);
+        return extent.byte + extent.length;
     }
     /// Entries for which a condition holds may be longer than the others.
     static bool holdsItsFields(const ListLayout& list, const LogRecord& entry) {
@@ -178,8 +189,7 @@ private:
             if (field.condition == nullptr || !field.position) {
                 continue;
             }
-            const Extent extent = extentOf(*field.position);
-            if (!entry.has(extent.byte + extent.length) && field.condition->holdsIn(entry)) {
+            if (!entry.has(endOf(*field.position)) && field.condition->holdsIn(entry)) {
                 return false;
             }
         }

@@ -6,13 +6,14 @@
 #include <bit>
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <optional>
 #include <string_view>
 
 namespace pallax::doubles {
 
 /// A checksum of the field, entry, raw number and value of samples in their order, and of beginning
-/// lists and removed keys. The same on every machine.
+/// lists and removed keys, for comparison within one process.
 class SampleChecksum {
 public:
     /// `value` is the result of one of the functions below.
@@ -31,12 +32,18 @@ public:
     }
     static std::uint64_t of(double number) { return std::bit_cast<std::uint64_t>(number); }
     static std::uint64_t of(std::string_view text) {
-        constexpr std::size_t kWord = sizeof(std::uint64_t);
+        constexpr unsigned kByteBits = 8;
         std::uint64_t sum = text.size();
-        for (; text.size() >= kWord; text.remove_prefix(kWord)) {
-            sum = mixed(sum, word(text, kWord));
+        std::uint64_t word = 0;
+        for (; text.size() >= sizeof(word); text.remove_prefix(sizeof(word))) {
+            std::memcpy(&word, text.data(), sizeof(word));
+            sum = mixed(sum, word);
         }
-        return mixed(sum, word(text, text.size()));
+        word = 0;
+        for (const char character : text) {
+            word = word << kByteBits | static_cast<unsigned char>(character);
+        }
+        return mixed(sum, word);
     }
     static std::uint64_t of(std::string_view text, double number) {
         return mixed(of(text), of(number));
@@ -55,19 +62,9 @@ private:
         constexpr int kTurn = 29;
         return std::rotl((sum ^ number) * kFactors[0], kTurn);
     }
-    static std::uint64_t word(std::string_view text, std::size_t bytes) {
-        constexpr unsigned kByteBits = 8;
-        std::uint64_t word = 0;
-        for (std::size_t index = 0; index < bytes; ++index) {
-            word |= std::uint64_t{static_cast<unsigned char>(text[index])} << (index * kByteBits);
-        }
-        return word;
-    }
-    /// Only the rotation and the sum depend on the previous sample.
     void add(std::uint64_t number) {
-        constexpr unsigned kHalf = 32;
         constexpr int kTurn = 13;
-        _sum = std::rotl(_sum, kTurn) + (number ^ (number >> kHalf)) * kFactors[0];
+        _sum = std::rotl(_sum, kTurn) + number;
     }
 
     std::uint64_t _sum = 1;
