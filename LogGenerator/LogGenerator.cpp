@@ -1,5 +1,6 @@
 #include "LogGenerator/LogGenerator.h"
 
+#include "LogGenerator/KeyFrame.h"
 #include "LogGenerator/Records/Exceptions.h"
 #include "platform/Clock.h"
 #include "platform/SystemLog.h"
@@ -51,6 +52,13 @@ SectionAges LogGenerator::sectionAges(const Dictionary& state) {
 
 SectionAges LogGenerator::agesIn(const Dictionary& /*state*/) const {
     return {};
+}
+
+KeyFrame LogGenerator::keyFrame(const Dictionary& state) {
+    bringDisplayUpToDate();
+    KeyFrame keyFrame;
+    addTo(keyFrame, state);
+    return keyFrame;
 }
 
 bool LogGenerator::keepsDisplay(const Dictionary& state) const {

@@ -10,6 +10,7 @@
 
 namespace pallax {
 
+struct KeyFrame;
 class Bundle;
 class Clock;
 class LogGenerator;
@@ -62,6 +63,11 @@ public:
     virtual void setSampleSink(SampleSink* /*sink*/) {}
     /// The times at which the values of the display, brought up to date, were last read.
     SectionAges sectionAges(const Dictionary& state);
+    /// What later packets build on; `state` as for `display`.
+    KeyFrame keyFrame(const Dictionary& state);
+    /// Goes on from a key frame of the same technology. For a new generator and an empty state.
+    /// Until the next packet, the display is the key frame's.
+    virtual void resume(Dictionary& /*state*/, const KeyFrame& /*from*/) {}
     /// True when this generator cannot update the display that an earlier one left in the state.
     virtual bool keepsDisplay(const Dictionary& state) const;
     /// The property-list dictionary that starts the modem's stream.
@@ -87,6 +93,9 @@ protected:
     virtual void bringDisplayUpToDate() {}
     /// The ages in the state's live display, which is up to date. Empty unless overridden.
     virtual SectionAges agesIn(const Dictionary& state) const;
+
+    /// Adds this generator's part of a key frame; the display is up to date.
+    virtual void addTo(KeyFrame& /*keyFrame*/, const Dictionary& /*state*/) const {}
 
     /// Selects the constructors of a generator without parts, which log and build nothing.
     struct WithoutParts {};

@@ -1,9 +1,11 @@
 #include "LogGenerator/ZORLogGenerator2.h"
 
+#include "LogGenerator/KeyFrame.h"
 #include "LogGenerator/LogPacket.h"
 #include "platform/Clock.h"
 #include "platform/Resources.h"
 #include "platform/SystemLog.h"
+#include "plist/DeepCopy.h"
 
 #include <charconv>
 
@@ -210,6 +212,32 @@ SectionAges ZORLogGenerator2::agesIn(const Dictionary& state) const {
         noteAges(*root, {}, *cIndex, ages);
     }
     return ages;
+}
+
+void ZORLogGenerator2::addTo(KeyFrame& keyFrame, const Dictionary& state) const {
+    const PropertyList* display = state.find("Display");
+    if (cIndex == nullptr || display == nullptr) {
+        return;
+    }
+    keyFrame.display = deepCopy(*display);
+    for (const auto& [record, firstRow] : cIndex->records()) {
+        keyFrame.records.push_back({record->display().times(), record->memory().remembered});
+    }
+}
+
+void ZORLogGenerator2::resume(Dictionary& state, const KeyFrame& from) {
+    if (cIndex == nullptr || from.display.isNull()) {
+        return;
+    }
+    (void)getDisplayFromState(state); // as for a first packet: gives the records their sections
+    if (const PropertyList* display = state.find("Display")) {
+        copyInto(*display, from.display);
+    }
+    for (std::size_t index = 0; index < from.records.size(); ++index) {
+        LayoutRecord& record = *cIndex->records().at(index).record;
+        record.display().times() = from.records[index].times;
+        record.memory().remembered = from.records[index].remembered;
+    }
 }
 
 void ZORLogGenerator2::setSampleSink(SampleSink* sink) {

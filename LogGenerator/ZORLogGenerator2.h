@@ -24,6 +24,7 @@ public:
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
     void setSampleSink(SampleSink* sink) override;
+    void resume(Dictionary& state, const KeyFrame& from) override;
     PropertyList getStartCommand() const override;
 
     /// Checks the framing of one packet and dispatches it.
@@ -39,6 +40,7 @@ public:
 protected:
     void bringDisplayUpToDate() override;
     SectionAges agesIn(const Dictionary& state) const override;
+    void addTo(KeyFrame& keyFrame, const Dictionary& state) const override;
 
     /// The parts of a technology: the template's resource name and a new class index.
     struct Parts {

@@ -1,10 +1,10 @@
 #pragma once
 
 #include "decoding/DisplayOutput.h"
-#include "decoding/TickGrid.h"
 #include "host/Recording.h"
 #include "monitor/DisplayDriver.h"
-#include "platform/Clock.h"
+#include "monitor/PacketClock.h"
+#include "monitor/TickGrid.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -22,17 +22,6 @@ struct DecoderEnvironment {
     StandardOutput& standardOutput; ///< for the generators' notices, which are not part of a
                                     ///< display
     std::span<const Technology> technologies;
-};
-
-/// The clock of a recording: shows the time of its latest packet or tick. Its zone is UTC.
-class PacketClock final : public Clock {
-public:
-    Time now() const override { return _now; }
-    Zone zone(Time /*time*/) const override { return {}; }
-    void set(Time now) { _now = now; }
-
-private:
-    Time _now;
 };
 
 /// Decodes the packets of one recording by driving its generator directly. Its display ticks are on

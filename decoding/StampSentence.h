@@ -1,6 +1,6 @@
 #pragma once
 
-#include "timeline/StampSequence.h"
+#include "packets/StampSequence.h"
 
 #include <cstdint>
 #include <string>

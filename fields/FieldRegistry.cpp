@@ -1,6 +1,6 @@
 #include "fields/FieldRegistry.h"
 
-#include "host/Recording.h"
+#include "platform/RecordedTechnology.h"
 
 #include <algorithm>
 #include <cmath>

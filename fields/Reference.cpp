@@ -5,7 +5,7 @@
 #include "LogGenerator/UTRAN/UTRANClassIndex.h"
 #include "LogGenerator/ZOR_GSM/ZOR_GSMClassIndex.h"
 #include "fields/IfxSections.h"
-#include "host/Recording.h"
+#include "platform/RecordedTechnology.h"
 
 #include <algorithm>
 #include <array>

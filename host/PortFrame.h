@@ -2,7 +2,7 @@
 
 #include "text/Bytes.h"
 #include "text/Date.h"
-#include "timeline/StampSequence.h"
+#include "packets/StampSequence.h"
 
 #include <array>
 #include <cstddef>

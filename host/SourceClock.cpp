@@ -1,6 +1,6 @@
 #include "host/SourceClock.h"
 
-#include "timeline/TimeGrid.h"
+#include "packets/TimeGrid.h"
 
 #include <algorithm>
 #include <utility>

@@ -3,7 +3,7 @@
 #include "host/SourceTimeListener.h"
 #include "platform/Clock.h"
 #include "platform/RepeatingTimer.h"
-#include "timeline/StampSequence.h"
+#include "packets/StampSequence.h"
 
 #include <chrono>
 #include <cstdint>

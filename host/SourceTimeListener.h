@@ -1,7 +1,7 @@
 #pragma once
 
 #include "text/Date.h"
-#include "timeline/StampSequence.h"
+#include "packets/StampSequence.h"
 
 #include <cstdint>
 

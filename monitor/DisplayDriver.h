@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/KeyFrame.h"
 #include "LogGenerator/LogGenerator.h"
 #include "LogGenerator/Records/SampleFanOut.h"
 #include "plist/PropertyList.h"
@@ -63,6 +64,16 @@ public:
     /// As LogGenerator::sectionAges.
     SectionAges sectionAges() {
         return _generator ? _generator->sectionAges(_state) : SectionAges();
+    }
+    /// What later packets build on; empty without a generator.
+    KeyFrame keyFrame() { return _generator ? _generator->keyFrame(_state) : KeyFrame(); }
+    /// Goes on from a key frame of the same technology, with the generator that was just set.
+    /// History and raw capture start empty.
+    void resume(const KeyFrame& from) {
+        _state = Dictionary();
+        if (_generator) {
+            _generator->resume(_state, from);
+        }
     }
     /// The content of a snapshot. Its displays share the live display's sections.
     PropertyList saveContents() const {

@@ -42,8 +42,25 @@ public:
     static void write(LogPriority priority, std::string_view text);
 
 private:
+    friend class MutedSystemLog;
+
     static LogSink* _sink;
     static int _threshold; // -1 without a sink
+};
+
+/// While it lives, lines of the system log are dropped.
+class MutedSystemLog {
+public:
+    MutedSystemLog() : _sink(SystemLog::_sink), _threshold(SystemLog::_threshold) {
+        SystemLog::setSink(nullptr);
+    }
+    ~MutedSystemLog() { SystemLog::setSink(_sink, _threshold); }
+    MutedSystemLog(const MutedSystemLog&) = delete;
+    MutedSystemLog& operator=(const MutedSystemLog&) = delete;
+
+private:
+    LogSink* _sink;
+    int _threshold;
 };
 
 /// Logs a line. `format` is printf's, with %@ for objects; see `formatText`.

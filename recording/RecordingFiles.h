@@ -1,7 +1,7 @@
 #pragma once
 
 #include "host/PcapNgWriter.h"
-#include "timeline/StampSequence.h"
+#include "packets/StampSequence.h"
 
 #include <chrono>
 #include <cstdint>

@@ -2,7 +2,7 @@
 
 #include "platform/MainQueue.h"
 #include "telephony/PacketSink.h"
-#include "timeline/TimeGrid.h"
+#include "packets/TimeGrid.h"
 
 #include <algorithm>
 #include <cmath>

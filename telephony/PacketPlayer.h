@@ -4,7 +4,7 @@
 #include "sources/CodeFilter.h"
 #include "sources/PacketSource.h"
 #include "text/Date.h"
-#include "timeline/StampSequence.h"
+#include "packets/StampSequence.h"
 
 #include <chrono>
 #include <functional>

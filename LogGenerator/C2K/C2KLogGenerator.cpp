@@ -10,10 +10,12 @@
 #include "LogGenerator/C2K/OneXSystemIdentity.h"
 #include "LogGenerator/C2K/OneXTrafficErrors.h"
 #include "LogGenerator/C2K/ReverseDataRate.h"
+#include "LogGenerator/KeyFrame.h"
 #include "LogGenerator/LogPacket.h"
 #include "platform/Clock.h"
 #include "platform/Resources.h"
 #include "platform/SystemLog.h"
+#include "plist/DeepCopy.h"
 
 #include <algorithm>
 #include <array>
@@ -35,6 +37,10 @@ constexpr auto kCodes = std::to_array<const CodeLayout*>({
 });
 
 constexpr std::string_view kSorted = "_sorted";
+
+/// The keys of the state that are not running values.
+constexpr auto kCommonKeys = std::to_array<std::string_view>(
+    {"Template", "Display", "Lookup", "ExtraInfo", "DisplayState", "History"});
 
 /// The dictionary under a key of the state, or null.
 DictionaryRef dictionaryUnder(std::string_view key, const Dictionary& state) {
@@ -165,6 +171,35 @@ SectionAges C2KLogGenerator::agesIn(const Dictionary& state) const {
         noteAges(display, {}, _display->placesRead(), ages);
     }
     return ages;
+}
+
+void C2KLogGenerator::addTo(KeyFrame& keyFrame, const Dictionary& state) const {
+    const DictionaryRef display = dictionaryUnder("Display", state);
+    if (display == nullptr) {
+        return;
+    }
+    keyFrame.display = deepCopy(display);
+    for (const Dictionary::Entry& entry : state) {
+        if (std::find(kCommonKeys.begin(), kCommonKeys.end(), entry.key.view()) ==
+            kCommonKeys.end()) {
+            keyFrame.running.set(entry.key, deepCopy(entry.value));
+        }
+    }
+    keyFrame.records.push_back({_display->times(), _display->memory().remembered});
+}
+
+void C2KLogGenerator::resume(Dictionary& state, const KeyFrame& from) {
+    if (from.display.isNull()) {
+        return;
+    }
+    // The places of the lookup table point into this display, so it gets the content in place.
+    copyInto(getDisplayFromState(state), from.display);
+    for (const Dictionary::Entry& entry : from.running) {
+        state.set(entry.key, deepCopy(entry.value));
+    }
+    _display->usePlacesOf(dictionaryUnder("Lookup", state)); // for the ages
+    _display->times() = from.records.front().times;
+    _display->memory().remembered = from.records.front().remembered;
 }
 
 void C2KLogGenerator::setSampleSink(SampleSink* sink) {

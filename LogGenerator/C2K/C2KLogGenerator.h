@@ -29,6 +29,7 @@ public:
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
     void setSampleSink(SampleSink* sink) override;
+    void resume(Dictionary& state, const KeyFrame& from) override;
     /// False if the state has a lookup table from an earlier generator.
     bool keepsDisplay(const Dictionary& state) const override;
     PropertyList getStartCommand() const override;
@@ -50,6 +51,7 @@ public:
 protected:
     void bringDisplayUpToDate() override;
     SectionAges agesIn(const Dictionary& state) const override;
+    void addTo(KeyFrame& keyFrame, const Dictionary& state) const override;
 
 private:
     std::unique_ptr<LookupDisplay> _display;

@@ -29,6 +29,8 @@ public:
     /// sink must outlive the display or be removed first.
     void setSink(SampleSink* sink) { _sink = sink; }
 
+    /// Uses the places of this lookup table.
+    void usePlacesOf(const DictionaryRef& lookup);
     /// Sets the time of the next packet.
     void setPacketTime(Time time) { _packetTime = time; }
     /// Takes an accepted packet of the code number `index`. Without a lookup table (null) values
@@ -37,6 +39,10 @@ public:
               Dictionary& state);
     /// Reads the kept packets.
     void bringUpToDate();
+
+    /// When the values were last read.
+    ReadTimes& times() { return _times; }
+    RecordMemory& memory() { return _memory; }
 
     /// The time at which a place was last read.
     struct PlaceRead {
@@ -65,7 +71,6 @@ private:
 
     void readNow(const Code& code, const LogRecord& packet, const DictionaryRef& lookup,
                  Dictionary& state);
-    void usePlacesOf(const DictionaryRef& lookup);
     void findPlaces(const DictionaryRef& lookup);
 
     std::vector<Code> _codes;

@@ -1,5 +1,6 @@
 #include "LogGenerator/GSM/GSMLogGenerator.h"
 
+#include "LogGenerator/KeyFrame.h"
 #include "platform/Clock.h"
 #include "plist/PropertyListCodec.h"
 #include "text/Format.h"
@@ -91,13 +92,34 @@ void GSMLogGenerator::updateState(Dictionary& state, Bytes data) {
                                              kNotDeserializedLine);
     }
     requireDisplayForm(*object); // may throw, so before anything is stored
-    state.setFixed("DisplayState", *object);
-    state.setFixed("Display", displayToCome(*object));
-    state.setFixed("ExtraInfo", Dictionary());
+    take(state, *object);
     _read = environment().clock.now();
     if (_sink != nullptr) {
         _samples.give(*object, *_sink);
     }
+}
+
+void GSMLogGenerator::take(Dictionary& state, const PropertyList& object) {
+    state.setFixed("DisplayState", object);
+    state.setFixed("Display", displayToCome(object));
+    state.setFixed("ExtraInfo", Dictionary());
+}
+
+void GSMLogGenerator::addTo(KeyFrame& keyFrame, const Dictionary& state) const {
+    if (const PropertyList* object = state.find("DisplayState")) {
+        keyFrame.display = *object; // which is never changed
+        keyFrame.paths = _samples.paths();
+        keyFrame.paths.read = _read;
+    }
+}
+
+void GSMLogGenerator::resume(Dictionary& state, const KeyFrame& from) {
+    if (from.display.isNull()) {
+        return;
+    }
+    take(state, from.display);
+    _read = from.paths.read;
+    _samples.resume(from.paths);
 }
 
 PropertyList GSMLogGenerator::displayToCome(const PropertyList& object) {

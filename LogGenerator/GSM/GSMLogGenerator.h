@@ -46,6 +46,7 @@ public:
     void updateState(Dictionary& state, Bytes data) override;
     PropertyList generateLogUsingState(Dictionary& state) override;
     void setSampleSink(SampleSink* sink) override { _sink = sink; }
+    void resume(Dictionary& state, const KeyFrame& from) override;
     /// Always false: every message is the whole display.
     bool keepsDisplay(const Dictionary& /*state*/) const override { return false; }
     PropertyList getStartCommand() const override;
@@ -63,8 +64,11 @@ public:
 protected:
     void bringDisplayUpToDate() override;
     SectionAges agesIn(const Dictionary& state) const override;
+    void addTo(KeyFrame& keyFrame, const Dictionary& state) const override;
 
 private:
+    /// Makes a checked object the latest message.
+    void take(Dictionary& state, const PropertyList& object);
     /// The display of an object whose types were checked. A dictionary stays empty until
     /// `bringDisplayUpToDate`, because usually the next message comes before the display is needed.
     PropertyList displayToCome(const PropertyList& object);

@@ -117,18 +117,42 @@ void ObjectSamples::giveList(const Array& elements) {
 }
 
 FieldId ObjectSamples::take() {
-    auto found = _ids.find(std::string_view(_path));
-    if (found == _ids.end()) {
+    const auto found = _ids.find(std::string_view(_path));
+    FieldId id = found != _ids.end() ? found->second : kNoField;
+    if (id == kNoField) {
         if (_fields.size() == kMostPaths) {
             return kNoField;
         }
-        found = _ids.emplace(_path, static_cast<FieldId>(_fields.size())).first;
-        _fields.emplace_back().key = found->first;
+        id = add(_path);
     }
     if (_lists == 0) {
-        _shown.push_back(found->second);
+        _shown.push_back(id);
     }
-    return found->second;
+    return id;
+}
+
+FieldId ObjectSamples::add(std::string_view path) {
+    const auto id = static_cast<FieldId>(_fields.size());
+    _fields.emplace_back().key = _ids.emplace(path, id).first->first;
+    return id;
+}
+
+KeyFrame::Paths ObjectSamples::paths() const {
+    KeyFrame::Paths paths;
+    for (const Field& field : _fields) {
+        paths.known.emplace_back(field.key);
+    }
+    paths.shown = _shown;
+    return paths;
+}
+
+void ObjectSamples::resume(const KeyFrame::Paths& paths) {
+    _ids.clear();
+    _fields.clear();
+    for (const std::string& path : paths.known) {
+        (void)add(path);
+    }
+    _shown = paths.shown;
 }
 
 void ObjectSamples::removeOthers(const std::vector<FieldId>& before) {

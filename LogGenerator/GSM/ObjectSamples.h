@@ -1,5 +1,6 @@
 #pragma once
 
+#include "LogGenerator/KeyFrame.h"
 #include "LogGenerator/Records/Sample.h"
 #include "plist/PropertyList.h"
 
@@ -26,6 +27,10 @@ public:
     /// that this one lacks is a removed key. The object's types must have been checked.
     void give(const PropertyList& object, SampleSink& sink);
 
+    KeyFrame::Paths paths() const;
+    /// Goes on after another's message: the same paths have the same numbers.
+    void resume(const KeyFrame::Paths& paths);
+
 private:
     struct Hash {
         using is_transparent = void;
@@ -41,6 +46,7 @@ private:
     void giveList(const Array& elements);
     /// The number of the current path, or kNoField when there are too many.
     FieldId take();
+    FieldId add(std::string_view path);
     void removeOthers(const std::vector<FieldId>& before);
 
     std::unordered_map<std::string, FieldId, Hash, std::equal_to<>> _ids;

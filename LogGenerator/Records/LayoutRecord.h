@@ -28,6 +28,9 @@ public:
     /// The display sink of the section.
     SectionDisplay& display() { return _display; }
 
+    /// What the record keeps beside its section.
+    RecordMemory& memory() { return _memory; }
+
     /// `first` is the number of this record's first row. `packet` has the time of each packet when
     /// it arrives and must outlive the record. Before the first call rows count from 0 and have no
     /// time.

@@ -61,6 +61,11 @@ public:
         return known(latest);
     }
 
+    /// About how many bytes it holds.
+    std::size_t bytes() const {
+        return _rows.size() * sizeof(Time) + _keys.size() * sizeof(_keys[0]);
+    }
+
 private:
     static constexpr Time kNever = Time::min();
 

@@ -1,4 +1,4 @@
-#include "timeline/StampSequence.h"
+#include "packets/StampSequence.h"
 
 #include <algorithm>
 #include <cstdint>

@@ -1,4 +1,4 @@
-#include "decoding/TickGrid.h"
+#include "monitor/TickGrid.h"
 
 #include "tests/doubles/Property.h"
 

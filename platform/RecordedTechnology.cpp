@@ -1,4 +1,4 @@
-#include "host/Recording.h"
+#include "platform/RecordedTechnology.h"
 
 #include "platform/TelephonyConstants.h"
 

@@ -1,4 +1,4 @@
-#include "timeline/TimeGrid.h"
+#include "packets/TimeGrid.h"
 
 #include "tests/doubles/Property.h"
 

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "monitor/PallaxModel.h"
-#include "timeline/StampSequence.h"
-#include "timeline/TimeGrid.h"
+#include "packets/StampSequence.h"
+#include "packets/TimeGrid.h"
 
 #include <chrono>
 #include <cstdint>

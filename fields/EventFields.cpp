@@ -1,0 +1,123 @@
+#include "fields/EventFields.h"
+
+#include <array>
+#include <cstddef>
+
+namespace pallax {
+
+namespace {
+
+using Watch = EventFields::Watch;
+using Names = std::string_view;
+
+// The cells.
+constexpr std::array<Names, 2> kIfxCell{"ifx.serving_cell.arfcn", "ifx.serving_cell.bsic"};
+constexpr std::array<Names, 2> kGsmCell{"gsm.gsm_serving_cell.arfcn", "gsm.gsm_serving_cell.bsic"};
+constexpr std::array<Names, 2> kUmtsCell{"gsm.umts_rr_info.scrambling_code",
+                                         "gsm.umts_rr_info.uarfcn"};
+constexpr std::array<Names, 3> kOneXCell{"cdma.system_identity.base_station_id",
+                                         "cdma.system_identity.network_id",
+                                         "cdma.system_identity.system_id"};
+constexpr std::array<Names, 2> kEvdoCell{"cdma.ev_do.serving_pn_offset", "cdma.ev_do.channel"};
+constexpr std::array<Names, 2> kLteCell{"lte.serving_cell_info.physical_cell_id",
+                                        "lte.serving_cell_info.download_frequency"};
+constexpr std::array<Names, 2> kLteMeasuredCell{"lte.serving_cell_measurements.physical_cell_id",
+                                                "lte.serving_cell_measurements.e_arfcn"};
+constexpr std::array<Names, 2> kUtranCell{"utran.serving_cell_info.cell_scrambling_code",
+                                          "utran.serving_cell_info.downlink_uarfcn"};
+
+// The state machines.
+constexpr std::array<Names, 1> kIfxRr{"ifx.rr"};
+constexpr std::array<Names, 1> kMm{"gsm.process_cs.mm_state"};
+constexpr std::array<Names, 1> kGmm{"gsm.process_ps.mm_state"};
+constexpr std::array<Names, 1> kRr{"gsm.gsm_rr_info.rr_state"};
+constexpr std::array<Names, 1> kRrc{"gsm.umts_rr_info.rrc_state"};
+constexpr std::array<Names, 1> kOneXState{"cdma.1x.device_state"};
+constexpr std::array<Names, 1> kEvdoState{"cdma.ev_do.device_state"};
+constexpr std::array<Names, 1> kEvdoSession{"cdma.ev_do.session_state"};
+constexpr std::array<Names, 1> kUtranRrc{"utran.rrc_info.state"};
+
+constexpr std::array<Names, 2> kToUmts{"RR_G2W_INTERRAT_RESELECTION_PROGRESS",
+                                       "RR_G2W_INTERRAT_HANDOVER_ PROGRESS"};
+constexpr std::array<Names, 3> kToGsm{"RR_W2G_INTERRAT_RESELECTION_PROGRESS",
+                                      "RR_W2G_INTERRAT_HANDOVER_ PROGRESS",
+                                      "RR_W2G_INTERRAT_CC_ORDER_ PROGRESS"};
+
+// Service and registration.
+constexpr std::array<Names, 1> kIfxNetwork{"ifx.network.mcc"};
+constexpr std::array<Names, 1> kServiceType{"gsm.serving_plmn.service_type"};
+constexpr std::array<Names, 3> kService{"CS_ONLY", "PS_ONLY", "CS_PS_SERVICE"};
+constexpr std::array<Names, 2> kNoService{"NO_SERVICE", "LIMITED_SERVICE"};
+constexpr std::array<Names, 1> kMmSubState{"gsm.process_cs.mm_sub_state"};
+constexpr std::array<Names, 1> kMmService{"MM_NORMAL_SERVICE"};
+constexpr std::array<Names, 5> kMmNoService{"MM_NULL_SUBSTATE", "MM_NO_IMSI", "MM_PLMN_SEARCH",
+                                            "MM_LIMITED_SERVICE", "MM_NO_CELL_AVAILABLE"};
+constexpr std::array<Names, 3> kGmmRegistered{"GMM_REGISTERED", "GMM_ROUTING_AREA_UPDATE_INITIATED",
+                                              "GMM_SERVICE_REQUEST_INITIATED"};
+constexpr std::array<Names, 2> kGmmLost{"GMM_NULL", "GMM_DEREGISTERED"};
+constexpr std::array<Names, 3> kOneXService{"Paging [6]", "Slotted mode sleep state [7]",
+                                            "Traffic [8]"};
+constexpr std::array<Names, 3> kOneXLost{"Inactive [0]", "Initial state for CDMA operation [2]",
+                                         "Acquisition [3]"};
+constexpr std::array<Names, 3> kEvdoService{"Idle [3]", "Access [4]", "Connected [5]"};
+constexpr std::array<Names, 2> kEvdoLost{"Inactive [0]", "Acquisition [1]"};
+
+// Contexts.
+constexpr std::array<Names, 1> kGsmContexts{"gsm.pdp_context_info"};
+constexpr std::array<Names, 1> kLteContexts{"lte.pdp_context_info"};
+constexpr std::array<Names, 1> kUtranContexts{"utran.pdp_context_info"};
+
+constexpr std::string_view kCell = "serving cell";
+
+constexpr auto kRows = std::to_array<EventFields>({
+    {"ifx", Watch::Cell, kCell, kIfxCell},
+    {"ifx", Watch::State, "RR", kIfxRr},
+    {"ifx", Watch::Service, "service", kIfxNetwork},
+
+    {"gsm", Watch::Technology, "GSM → UMTS", kRr, kToUmts},
+    {"gsm", Watch::Technology, "UMTS → GSM", kRr, kToGsm},
+    {"gsm", Watch::Cell, "GSM serving cell", kGsmCell},
+    {"gsm", Watch::Cell, "UMTS serving cell", kUmtsCell},
+    {"gsm", Watch::State, "MM", kMm},
+    {"gsm", Watch::State, "GMM", kGmm},
+    {"gsm", Watch::State, "RR", kRr},
+    {"gsm", Watch::State, "RRC", kRrc},
+    {"gsm", Watch::Service, "service", kServiceType, kService, kNoService},
+    {"gsm", Watch::Service, "registration", kMmSubState, kMmService, kMmNoService},
+    {"gsm", Watch::Service, "GPRS registration", kGmm, kGmmRegistered, kGmmLost},
+    {"gsm", Watch::Contexts, "context", kGsmContexts},
+
+    {"cdma", Watch::Cell, "1x serving cell", kOneXCell},
+    {"cdma", Watch::Cell, "EV-DO serving cell", kEvdoCell},
+    {"cdma", Watch::State, "1x", kOneXState},
+    {"cdma", Watch::State, "EV-DO", kEvdoState},
+    {"cdma", Watch::State, "EV-DO session", kEvdoSession},
+    {"cdma", Watch::Service, "1x service", kOneXState, kOneXService, kOneXLost},
+    {"cdma", Watch::Service, "EV-DO service", kEvdoState, kEvdoService, kEvdoLost},
+
+    {"lte", Watch::Cell, kCell, kLteCell},
+    {"lte", Watch::Cell, kCell, kLteMeasuredCell},
+    {"lte", Watch::Contexts, "context", kLteContexts},
+
+    {"utran", Watch::Cell, kCell, kUtranCell},
+    {"utran", Watch::State, "RRC", kUtranRrc},
+    {"utran", Watch::Contexts, "context", kUtranContexts},
+});
+
+constexpr std::array<std::string_view, 11> kWords{
+    "cell-change",  "ping-pong",        "state-change", "technology-change",
+    "service-lost", "service-regained", "context-up",   "context-down",
+    "gap",          "time-step",        "fatal-record",
+};
+
+} // namespace
+
+std::string_view wordOf(EventKind kind) {
+    return kWords.at(static_cast<std::size_t>(kind));
+}
+
+std::span<const EventFields> eventFields() {
+    return kRows;
+}
+
+} // namespace pallax
