@@ -54,6 +54,8 @@ const std::vector<Layer>& layers() {
          {"text", "plist", "platform", records, generators, common, "LogGenerator/C2K",
           "LogGenerator/GSM", "LogGenerator/LTE", "LogGenerator/UTRAN", "LogGenerator/ZOR_GSM",
           "LogGenerator/Technologies"}},
+        {"timeline",
+         {"text", "plist", "platform", "packets", records, generators, "monitor", "fields"}},
         {"host", {"text", "plist", "platform", "packets"}},
         {"ui/terminal", {"text", "plist", "platform", "platform/ui", "app/tree", "app/pane"}},
         {"simulator", {"text", "plist", "platform", "packets", "host"}},

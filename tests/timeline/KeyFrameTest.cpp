@@ -1,0 +1,127 @@
+#include "LogGenerator/KeyFrame.h"
+
+#include "monitor/Frame.h"
+#include "tests/doubles/RecordingLog.h"
+#include "tests/doubles/SampleRecorder.h"
+#include "tests/timeline/TimelineFixture.h"
+#include "timeline/Replay.h"
+
+#include <exception>
+#include <string>
+
+namespace pallax {
+namespace {
+
+using namespace std::chrono_literals;
+namespace any = doubles::any;
+
+/// A display with the time at which each of its nodes was read.
+std::string pictureOf(Replay& replay) {
+    const PropertyList display = replay.displayAt({});
+    PathDictionary paths;
+    (void)PallaxModelNode::makeTreeFromObject(display, paths);
+    const SectionAges ages = replay.ages();
+    std::string picture = display.description();
+    for (const auto& [path, node] : std::map(paths.begin(), paths.end())) {
+        const auto read = ages.lastRead(path);
+        picture += "\n" + path + " " + (read ? isoTimeText(*read) : "never");
+    }
+    return picture;
+}
+
+/// A record may throw; then it has no effect that either of two decoders would not have.
+void update(Replay& replay, const JournalPacket& packet, SampleSink& sink) {
+    try {
+        replay.update(packet, &sink);
+    } catch (const std::exception&) {
+        return;
+    }
+}
+
+/// Whether a decoder that goes on from a key frame is like the one that gave it.
+void compareFromKeyFrame(const TimelineFixture& fixture, std::uint64_t instant) {
+    const MemoryJournal& journal = fixture.journal;
+    const DecodingSource source = fixture.source();
+    doubles::SampleRecorder expected;
+    doubles::SampleRecorder actual;
+    Replay whole(source);
+    for (std::uint64_t number = 1; number <= instant; ++number) {
+        update(whole, journal.packet(number), expected);
+    }
+    Replay resumed(source);
+    resumed.resume(whole.keyFrame(), instant);
+    (void)expected.takeLines();
+    RC_ASSERT(pictureOf(resumed) == pictureOf(whole));
+    for (std::uint64_t number = instant + 1; number <= journal.size(); ++number) {
+        update(whole, journal.packet(number), expected);
+        update(resumed, journal.packet(number), actual);
+        RC_ASSERT(actual.takeLines() == expected.takeLines());
+        if (number % 37 == 0) { // not always: between, records are kept and not read
+            RC_ASSERT(pictureOf(resumed) == pictureOf(whole));
+        }
+    }
+    RC_ASSERT(pictureOf(resumed) == pictureOf(whole));
+}
+
+class KeyFrameTest : public testing::TestWithParam<const char*> {};
+
+TEST_P(KeyFrameTest, ADecoderGoesOnFromItInDrivesAsIfItHadReadThePacketsBefore) {
+    EXPECT_TRUE(doubles::holds([this] {
+        TimelineFixture fixture(GetParam());
+        fixture.drive(any::bits(), std::chrono::seconds(any::between(1, 20)), 20);
+        compareFromKeyFrame(fixture, any::index(fixture.journal.size() + 1));
+    }));
+}
+
+TEST_P(KeyFrameTest, ADecoderGoesOnFromItInAnyBytes) {
+    EXPECT_TRUE(doubles::holds([this] {
+        TimelineFixture fixture(GetParam());
+        fixture.anyPackets(60);
+        compareFromKeyFrame(fixture, any::index(fixture.journal.size() + 1));
+    }));
+}
+
+TEST_P(KeyFrameTest, ItSharesNothingWithTheDecoderThatGaveIt) {
+    TimelineFixture fixture(GetParam());
+    fixture.drive(3, 20s);
+    doubles::SampleRecorder samples;
+    Replay replay(fixture.source());
+    for (std::uint64_t number = 1; number <= 100; ++number) {
+        update(replay, fixture.journal.packet(number), samples);
+    }
+    const KeyFrame keyFrame = replay.keyFrame();
+    const std::string then = keyFrame.display.description();
+    const std::string picture = pictureOf(replay);
+    for (std::uint64_t number = 101; number <= fixture.journal.size(); ++number) {
+        update(replay, fixture.journal.packet(number), samples);
+    }
+    EXPECT_NE(pictureOf(replay), picture) << "the packets change the display";
+    EXPECT_EQ(keyFrame.display.description(), then);
+    Replay resumed(fixture.source());
+    resumed.resume(keyFrame, 100);
+    EXPECT_EQ(pictureOf(resumed), picture);
+}
+
+TEST_P(KeyFrameTest, DecodingAgainIsQuiet) {
+    TimelineFixture fixture(GetParam());
+    fixture.drive(3, 5s);
+    const doubles::RecordingLog log;
+    {
+        doubles::SampleRecorder samples;
+        Replay replay(fixture.source());
+        update(replay, fixture.journal.packet(1), samples);
+        Replay resumed(fixture.source());
+        resumed.resume(replay.keyFrame(), 1);
+        update(resumed, fixture.journal.packet(2), samples);
+        (void)pictureOf(resumed);
+    }
+    EXPECT_TRUE(log.lines().empty()) << log.lines().front().text;
+    systemLog(LogPriority::Error, "afterwards the log works");
+    EXPECT_EQ(log.lines().size(), 1U);
+}
+
+INSTANTIATE_TEST_SUITE_P(Technologies, KeyFrameTest, testing::ValuesIn(technologyNames()),
+                         [](const auto& each) { return std::string(each.param); });
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,245 @@
+#include "timeline/CurrentValues.h"
+
+#include "plist/DeepCopy.h"
+
+#include <algorithm>
+
+namespace pallax {
+
+namespace {
+
+double numberOf(const SampleValue& value) {
+    if (const DisplayNumber* number = value.number()) {
+        return number->isReal() ? number->real() : static_cast<double>(number->integer());
+    }
+    const NumberText* text = value.numberText();
+    return text != nullptr ? text->number : NAN;
+}
+
+bool shows(const FieldValue& value, const SampleValue& sampled) {
+    if (const DisplayNumber* number = sampled.number()) {
+        const DisplayNumber* held = value.shown.displayNumber();
+        return held != nullptr && held->sameNumberAndFormat(*number);
+    }
+    const Text* text = value.shown.text();
+    return sampled.object() == nullptr && text != nullptr && text->view() == sampled.words();
+}
+
+void store(FieldValue& target, const SampleValue& value) {
+    value.showIn(target.shown);
+    target.number = numberOf(value);
+}
+
+bool isEmptied(const EntryValues& entry, std::size_t held) {
+    return held == 0 && entry.values.empty();
+}
+
+} // namespace
+
+void CurrentValues::clear() {
+    _values.clear();
+    _lists.clear();
+    _places.clear();
+    _open.clear();
+}
+
+void CurrentValues::take(const CurrentValues& other) {
+    Listener* const listener = _listener;
+    *this = other;
+    _listener = listener;
+}
+
+const FieldValue* CurrentValues::value(std::string_view fieldName) const {
+    const auto field = _fields->named(fieldName);
+    return field ? value(*field) : nullptr;
+}
+
+std::size_t CurrentValues::bytes() const {
+    std::size_t bytes = sizeof(CurrentValues);
+    for (const FieldValue& value : _values) {
+        bytes += sizeof(value.number) + bytesOf(value.shown);
+    }
+    for (const List& list : _lists) {
+        for (const Slot& slot : list.slots) {
+            bytes += sizeof(Slot);
+            for (const auto& [field, value] : slot.held.values) {
+                bytes += sizeof(double) + sizeof(field) + bytesOf(value.shown);
+            }
+        }
+    }
+    return bytes;
+}
+
+void CurrentValues::sample(const Sample& sample) {
+    if (!_open.empty()) {
+        return sampleInEntry(_open.back(), sample);
+    }
+    for (const FieldIndex field : _fields->of(sample)) {
+        if (field >= _values.size()) {
+            _values.resize(_fields->size());
+        }
+        FieldValue& value = _values[field];
+        store(value, sample.value);
+        if (_listener != nullptr) {
+            _listener->valueRead(field, kNoEntry, value);
+        }
+    }
+}
+
+void CurrentValues::sampleInEntry(Open& open, const Sample& sample) {
+    if (!open.isInEntry) {
+        return;
+    }
+    std::vector<std::pair<FieldIndex, FieldValue>>& values = slotOf(open).held.values;
+    for (const FieldIndex field : _fields->of(sample)) {
+        if (open.held == values.size()) {
+            values.emplace_back(field, FieldValue());
+            open.isAnother = true;
+        }
+        auto& [heldField, value] = values[open.held++];
+        if (_fields->identifies(field) && (heldField != field || !shows(value, sample.value))) {
+            open.isAnother = true;
+        }
+        heldField = field;
+        store(value, sample.value);
+    }
+}
+
+void CurrentValues::keyRemoved(std::string_view key) {
+    for (const FieldIndex field : _fields->underKey(_section, key)) {
+        if (field < _values.size() && !_values[field].isEmpty()) {
+            _values[field] = {};
+            if (_listener != nullptr) {
+                _listener->valueRemoved(field);
+            }
+        }
+    }
+    const auto list = _places.find(_entries->list(_section, key, 0));
+    if (list != _places.end()) {
+        empty(list->second);
+    }
+}
+
+std::size_t CurrentValues::placeOf(ListId id, std::size_t outer) {
+    const auto [found, isNew] = _places.emplace(id, _lists.size());
+    if (isNew) {
+        _lists.push_back({id, outer, {}, 0});
+    }
+    return found->second;
+}
+
+/// Empties a list and the lists in it.
+void CurrentValues::empty(std::size_t place) {
+    _lists[place].count = 0;
+    if (_listener != nullptr) {
+        _listener->listReplaced(_lists[place].id);
+    }
+    for (std::size_t inner = place + 1; _hasInnerLists && inner < _lists.size(); ++inner) {
+        if (_lists[inner].outer == place) {
+            empty(inner);
+        }
+    }
+}
+
+void CurrentValues::beginList(const SampleList& list) {
+    Open open;
+    if (_open.empty()) {
+        open.list = placeOf(_entries->list(_section, list.key, 0), kNone);
+        empty(open.list);
+    } else {
+        Open& around = _open.back();
+        _hasInnerLists = true;
+        if (around.isInEntry && !around.isIdentified) {
+            identify(around);
+        }
+        const ListId outer = _lists[around.list].id;
+        open.list = placeOf(_entries->list(_section, list.key, outer), around.list);
+        open.outer = around.isInEntry ? slotOf(around).held.entry : around.outer;
+    }
+    _open.push_back(open);
+}
+
+void CurrentValues::endList() {
+    _open.pop_back();
+}
+
+void CurrentValues::beginEntry(std::size_t index, std::int64_t name) {
+    Open& open = _open.back();
+    List& list = _lists[open.list];
+    if (list.count == list.slots.size()) {
+        list.slots.emplace_back();
+    }
+    open.index = index;
+    open.name = name;
+    open.held = 0;
+    open.isInEntry = true;
+    open.isIdentified = false;
+    const Slot& slot = list.slots[list.count];
+    open.isAnother = slot.known == kNoEntry || slot.outer != open.outer || slot.index != index ||
+                     slot.name != name;
+}
+
+void CurrentValues::endEntry() {
+    Open& open = _open.back();
+    Slot& slot = slotOf(open);
+    if (slot.held.values.size() > open.held) {
+        slot.held.values.resize(open.held);
+        open.isAnother = true;
+    }
+    open.isInEntry = false;
+    if (isEmptied(slot.held, open.held)) {
+        slot.known = kNoEntry;
+        return; // nothing is shown of it
+    }
+    if (!open.isIdentified) {
+        identify(open);
+    }
+    ++_lists[open.list].count;
+    if (_listener != nullptr) {
+        for (const auto& [field, value] : slot.held.values) {
+            _listener->valueRead(field, slot.held.entry, value);
+        }
+    }
+}
+
+void CurrentValues::identify(Open& open) {
+    Slot& slot = slotOf(open);
+    if (open.isAnother) {
+        slot.known = identified(open, slot);
+        slot.outer = open.outer;
+        slot.index = open.index;
+        slot.name = open.name;
+    }
+    slot.held.entry = slot.known;
+    open.isIdentified = true;
+    const List& list = _lists[open.list];
+    std::size_t time = 1;
+    for (std::size_t index = 0; index < list.count; ++index) {
+        time += list.slots[index].known == slot.known ? 1 : 0;
+    }
+    if (time > 1) {
+        slot.held.entry = _entries->again(slot.known, time);
+    }
+}
+
+EntryId CurrentValues::identified(const Open& open, const Slot& slot) {
+    return _entries->entry(_lists[open.list].id, open.outer, identityOf(open, slot));
+}
+
+std::string CurrentValues::identityOf(const Open& open, const Slot& slot) const {
+    std::string identity;
+    for (std::size_t index = 0; index < open.held; ++index) {
+        const auto& [field, value] = slot.held.values[index];
+        const FieldInfo& info = (*_fields)[field];
+        if (!info.identity.empty() && info.identity.front() == kEntryName) {
+            return "PN " + std::to_string(open.name);
+        }
+        if (info.identifies) {
+            identity.append(identity.empty() ? "" : ", ");
+            identity.append(info.key).append(info.key.empty() ? "" : " ").append(value.text());
+        }
+    }
+    return identity.empty() ? "#" + std::to_string(open.index + 1) : identity;
+}
+
+} // namespace pallax

@@ -1,0 +1,70 @@
+#pragma once
+
+#include "LogGenerator/Records/Sample.h"
+#include "fields/FieldRegistry.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <deque>
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace pallax {
+
+class Resources;
+struct RecordedTechnology;
+
+/// The place of a field in its table.
+using FieldIndex = std::uint32_t;
+
+/// The fields of one recording: those of the technology's registry and, for an object stream, the
+/// further paths of its messages in the order of arrival.
+class FieldTable {
+public:
+    /// The most paths of an object stream that become fields.
+    static constexpr std::size_t kMostPaths = 4096;
+
+    FieldTable(const RecordedTechnology& technology, const Resources& resources);
+
+    /// References stay valid.
+    const FieldInfo& operator[](FieldIndex index) const { return _fields[index]; }
+    std::size_t size() const { return _fields.size(); }
+    std::optional<FieldIndex> named(std::string_view name) const;
+
+    /// Whether messages have paths instead of numbered rows.
+    bool isObjectStream() const { return _isObjectStream; }
+    /// Whether paths of an object stream may be missing because there are too many.
+    bool isFull() const { return _rows.size() >= kMostPaths && _isObjectStream; }
+
+    /// The fields that show a sample: usually one; of CDMA, one for each place.
+    std::span<const FieldIndex> of(const Sample& sample) {
+        if (sample.id < _rows.size() && !_rows[sample.id].empty()) {
+            return _rows[sample.id];
+        }
+        return added(sample);
+    }
+    /// The fields outside lists under that key of a section; of an object stream, at that path.
+    std::span<const FieldIndex> underKey(std::string_view section, std::string_view key) const;
+
+    /// Whether the field is part of the identity of its list's entries.
+    bool identifies(FieldIndex index) const { return _fields[index].identifies; }
+
+private:
+    std::span<const FieldIndex> added(const Sample& sample);
+    FieldIndex add(FieldInfo info);
+    FieldInfo infoOfPath(std::string_view path) const;
+
+    std::string _technology;
+    bool _isObjectStream = false;
+    std::deque<FieldInfo> _fields;
+    std::vector<std::vector<FieldIndex>> _rows; ///< by the number of the row or path
+    std::unordered_map<std::string, FieldIndex> _byName;
+    std::unordered_map<std::string, FieldIndex> _byPath;
+    std::unordered_map<std::string, std::vector<FieldIndex>> _byKey; ///< "section\nkey"
+};
+
+} // namespace pallax

@@ -1,0 +1,187 @@
+#include "timeline/Series.h"
+
+#include <algorithm>
+#include <functional>
+
+namespace pallax {
+
+namespace {
+
+/// Gives the readings of one field and entry.
+class FieldReader final : public SampleSink, private CurrentValues::Listener {
+public:
+    using Take = std::function<void(const SamplePacket& packet, const FieldValue& value)>;
+
+    FieldReader(Timeline& timeline, FieldIndex field, EntryId entry, Take take)
+        : _values(timeline.fieldTable(), timeline.entryTable()), _field(field), _entry(entry),
+          _take(std::move(take)) {
+        _values.setListener(this);
+    }
+
+    void beginPacket(const SamplePacket& packet) override {
+        _packet = packet;
+        _values.beginPacket(packet);
+    }
+    void beginSection(std::string_view section) override { _values.beginSection(section); }
+    void sample(const Sample& sample) override { _values.sample(sample); }
+    void keyRemoved(std::string_view key) override { _values.keyRemoved(key); }
+    void beginList(const SampleList& list) override { _values.beginList(list); }
+    void endList() override { _values.endList(); }
+    void beginEntry(std::size_t index, std::int64_t name) override {
+        _values.beginEntry(index, name);
+    }
+    void endEntry() override { _values.endEntry(); }
+
+private:
+    void valueRead(FieldIndex field, EntryId entry, const FieldValue& value) override {
+        if (field == _field && entry == _entry) {
+            _take(_packet, value);
+        }
+    }
+    void valueRemoved(FieldIndex /*field*/) override {}
+    void listReplaced(ListId /*list*/) override {}
+
+    CurrentValues _values;
+    FieldIndex _field;
+    EntryId _entry;
+    Take _take;
+    SamplePacket _packet;
+};
+
+/// Up to this number of packets, buckets are read from the packets themselves.
+constexpr std::uint64_t kMostDecoded = 16384;
+
+bool isInOneStretch(const Timeline& timeline, std::uint64_t from, std::uint64_t to) {
+    return std::none_of(
+        timeline.stretches().begin(), timeline.stretches().end(),
+        [&](const Stretch& each) { return each.firstPacket > from && each.firstPacket <= to; });
+}
+
+/// The borders of buckets with the same number of packets.
+std::vector<std::uint64_t> evenBorders(std::uint64_t from, std::uint64_t end, std::size_t count) {
+    std::vector<std::uint64_t> borders;
+    const std::uint64_t packets = end - from;
+    for (std::size_t index = 0; index < count; ++index) {
+        borders.push_back(from + packets / count * index + packets % count * index / count);
+    }
+    return borders;
+}
+
+/// For ascending times of numbered packets: which begin one of `count` equal parts of the time.
+class EvenTimes {
+public:
+    EvenTimes(Time first, Time last, std::size_t count)
+        : _first(first), _span(std::chrono::duration<double>(last - first)), _count(count) {}
+
+    /// Whether the packet begins a part. Times may step back a little; parts do not.
+    bool begins(Time time) {
+        const double share =
+            _span.count() > 0 ? std::chrono::duration<double>(time - _first) / _span : 0.0;
+        const auto part = static_cast<std::size_t>(
+            std::clamp(share * static_cast<double>(_count), 0.0, static_cast<double>(_count - 1)));
+        if (part < _next) {
+            return false;
+        }
+        _next = part + 1;
+        return true;
+    }
+
+private:
+    Time _first;
+    std::chrono::duration<double> _span;
+    std::size_t _count;
+    std::size_t _next = 0;
+};
+
+struct Stamp {
+    std::uint64_t packet;
+    Time time;
+};
+
+std::vector<Stamp> stampsOf(const Timeline& timeline, std::uint64_t from, std::uint64_t to) {
+    std::vector<Stamp> stamps;
+    const auto reader = timeline.journal().reader(from);
+    for (auto packet = reader->next(); packet && packet->number <= to; packet = reader->next()) {
+        stamps.push_back({packet->number, packet->time});
+    }
+    return stamps;
+}
+
+std::vector<std::uint64_t> bordersOf(const std::vector<Stamp>& stamps, bool isByTime,
+                                     std::uint64_t end, std::size_t count) {
+    std::vector<std::uint64_t> borders;
+    if (isByTime) {
+        EvenTimes parts(stamps.front().time, stamps.back().time, count);
+        for (const Stamp& stamp : stamps) {
+            if (parts.begins(stamp.time)) {
+                borders.push_back(stamp.packet);
+            }
+        }
+    } else {
+        for (const std::uint64_t border : evenBorders(0, stamps.size(), count)) {
+            borders.push_back(stamps[border].packet);
+        }
+        borders.erase(std::unique(borders.begin(), borders.end()), borders.end());
+    }
+    borders.push_back(end);
+    return borders;
+}
+
+std::vector<Bucket> decodedBuckets(Timeline& timeline, FieldIndex field, EntryId entry,
+                                   const std::vector<Stamp>& stamps, std::size_t count) {
+    const std::uint64_t from = stamps.front().packet;
+    const std::uint64_t to = stamps.back().packet;
+    const auto borders = bordersOf(stamps, isInOneStretch(timeline, from, to), to + 1, count);
+    std::vector<Bucket> buckets;
+    for (std::size_t index = 0; index + 1 < borders.size(); ++index) {
+        buckets.push_back({borders[index], borders[index + 1], stamps[borders[index] - from].time});
+    }
+    auto bucket = buckets.begin();
+    FieldReader reader(timeline, field, entry,
+                       [&](const SamplePacket& packet, const FieldValue& value) {
+                           while (bucket->to <= packet.number) {
+                               ++bucket;
+                           }
+                           bucket->add(timeline.seriesValueOf(value));
+                       });
+    (void)timeline.read(from, to, reader);
+    return buckets;
+}
+
+} // namespace
+
+std::vector<SeriesPoint> readSeries(Timeline& timeline, FieldIndex field, EntryId entry,
+                                    std::uint64_t from, std::uint64_t to,
+                                    const MayContinue& mayContinue) {
+    std::vector<SeriesPoint> points;
+    FieldReader reader(timeline, field, entry,
+                       [&points](const SamplePacket& packet, const FieldValue& value) {
+                           points.push_back({packet.number, packet.time, value});
+                       });
+    (void)timeline.read(from, to, reader, mayContinue);
+    return points;
+}
+
+std::vector<Bucket> readBuckets(Timeline& timeline, FieldIndex field, EntryId entry,
+                                std::uint64_t from, std::uint64_t to, std::size_t count) {
+    from = std::max<std::uint64_t>(from, 1);
+    to = std::min(to, timeline.packets());
+    if (from > to || count == 0) {
+        return {};
+    }
+    const SeriesStore& store = timeline.series();
+    if (to - from < kMostDecoded) {
+        const std::vector<Stamp> stamps = stampsOf(timeline, from, to);
+        return stamps.empty() ? std::vector<Bucket>()
+                              : decodedBuckets(timeline, field, entry, stamps, count);
+    }
+    std::vector<Stamp> cells;
+    for (std::uint64_t packet = store.cellStart(from); packet <= to; packet += store.cellSize()) {
+        cells.push_back({packet, store.cellTime(packet)});
+    }
+    const std::uint64_t end = cells.back().packet + store.cellSize();
+    return store.buckets(field, entry,
+                         bordersOf(cells, isInOneStretch(timeline, from, to), end, count));
+}
+
+} // namespace pallax

@@ -1,0 +1,241 @@
+#include "timeline/SeriesStore.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+SeriesValue lesser(const SeriesValue& a, const SeriesValue& b) {
+    return !b.isNumber() || (a.isNumber() && a.number() <= b.number()) ? a : b;
+}
+
+SeriesValue greater(const SeriesValue& a, const SeriesValue& b) {
+    return !b.isNumber() || (a.isNumber() && a.number() >= b.number()) ? a : b;
+}
+
+SeriesValue numberOnly(const SeriesValue& value) {
+    return value.isNumber() ? value : SeriesValue();
+}
+
+std::uint64_t keyOf(FieldIndex field, EntryId entry) {
+    constexpr unsigned kHalf = 32;
+    return std::uint64_t{field} << kHalf | entry;
+}
+
+} // namespace
+
+void Bucket::add(const SeriesValue& value) {
+    add(Bucket{0, 0, {}, value, numberOnly(value), numberOnly(value), value});
+}
+
+void Bucket::add(const Bucket& later) {
+    if (later.isEmpty()) {
+        return;
+    }
+    first = isEmpty() ? later.first : first;
+    least = lesser(least, later.least);
+    most = greater(most, later.most);
+    last = later.last;
+}
+
+SeriesTexts::SeriesTexts() {
+    _texts.emplace_back(); // 0: no text
+    _texts.emplace_back("…");
+}
+
+std::uint32_t SeriesTexts::numberOf(std::string_view text) {
+    constexpr std::uint32_t kOthers = 1;
+    const auto found = _numbers.find(text);
+    if (found != _numbers.end()) {
+        return found->second;
+    }
+    if (_texts.size() >= kMostTexts || _bytes + text.size() > kMostBytes) {
+        return kOthers;
+    }
+    _bytes += text.size();
+    const auto number = static_cast<std::uint32_t>(_texts.size());
+    _texts.emplace_back(text);
+    _numbers.emplace(_texts.back(), number);
+    return number;
+}
+
+SeriesValue SeriesStore::valueOf(const FieldValue& value) {
+    if (!std::isnan(value.number)) {
+        return SeriesValue::ofNumber(value.number);
+    }
+    const Text* text = value.shown.text();
+    return SeriesValue::ofText(text != nullptr ? _texts.numberOf(text->view())
+                                               : _texts.numberOf(value.text()));
+}
+
+void SeriesStore::beginPacket(std::uint64_t number, Time time) {
+    while ((number - 1) >> _shift >= _limits.cells || _runCount > _limits.runs) {
+        const std::size_t before = _runCount;
+        halveCells();
+        // Many short series, which larger cells hardly make shorter, must not become more.
+        _isFull = _isFull || _runCount > before / 4 * 3;
+    }
+    _cell = static_cast<std::uint32_t>((number - 1) >> _shift);
+    while (_times.size() <= _cell) {
+        _times.push_back(time);
+    }
+}
+
+void SeriesStore::add(FieldIndex field, EntryId entry, const FieldValue& value) {
+    if (Series* series = seriesOf(field, entry)) {
+        add(*series, valueOf(value));
+    }
+}
+
+SeriesStore::Series* SeriesStore::seriesOf(FieldIndex field, EntryId entry) {
+    if (entry == kNoEntry && field < _plain.size() && _plain[field] != nullptr) {
+        return _plain[field];
+    }
+    if (entry != kNoEntry) {
+        const auto found = _ofEntries.find(keyOf(field, entry));
+        if (found != _ofEntries.end()) {
+            return found->second;
+        }
+    }
+    if (_isFull || _series.size() >= _limits.series || entry == EntryTable::kOthers) {
+        _isFull = true;
+        return nullptr;
+    }
+    Series& series = _series.emplace_back();
+    series.entry = entry;
+    if (entry != kNoEntry) {
+        _ofEntries.emplace(keyOf(field, entry), &series);
+    } else {
+        if (field >= _plain.size()) {
+            _plain.resize(field + std::size_t{1});
+        }
+        _plain[field] = &series;
+    }
+    return &series;
+}
+
+void SeriesStore::add(Series& series, const SeriesValue& value) {
+    std::vector<Run>& runs = series.runs;
+    const SeriesValue number = numberOnly(value);
+    const Run alone{_cell, _cell, value, number, number, value};
+    if (runs.empty() || runs.back().to < _cell) {
+        if (!runs.empty() && runs.back().to + 1 == _cell && runs.back().isConstant() &&
+            runs.back().last == value) {
+            runs.back().to = _cell;
+            return;
+        }
+        runs.push_back(alone);
+        ++_runCount;
+        return;
+    }
+    if (runs.back().from < runs.back().to) {
+        if (runs.back().last == value) {
+            return; // a constant, so nothing changes
+        }
+        Run own = runs.back();
+        --runs.back().to;
+        own.from = _cell;
+        runs.push_back(own);
+        ++_runCount;
+    }
+    Run& run = runs.back();
+    run.least = lesser(run.least, number);
+    run.most = greater(run.most, number);
+    run.last = value;
+}
+
+/// Appends a run, whose first cell may be the last one of the run before.
+void SeriesStore::appendMerged(std::vector<Run>& runs, Run run) {
+    if (!runs.empty() && runs.back().to == run.from) {
+        Run shared = runs.back();
+        shared.from = shared.to;
+        if (runs.back().from == runs.back().to) {
+            runs.pop_back();
+        } else {
+            --runs.back().to;
+        }
+        shared.least = lesser(shared.least, run.least);
+        shared.most = greater(shared.most, run.most);
+        shared.last = run.last;
+        appendMerged(runs, shared);
+        if (run.from == run.to) {
+            return;
+        }
+        ++run.from;
+    }
+    if (!runs.empty() && runs.back().isConstant() && run.isConstant() &&
+        runs.back().last == run.first && runs.back().to + 1 == run.from) {
+        runs.back().to = run.to;
+        return;
+    }
+    runs.push_back(run);
+}
+
+void SeriesStore::halveCells() {
+    ++_shift;
+    _runCount = 0;
+    std::vector<Run> merged;
+    for (Series& series : _series) {
+        merged.clear();
+        for (Run run : series.runs) {
+            run.from /= 2;
+            run.to /= 2;
+            appendMerged(merged, run);
+        }
+        series.runs.assign(merged.begin(), merged.end());
+        _runCount += merged.size();
+    }
+    for (std::size_t cell = 0; cell < _times.size(); cell += 2) {
+        _times[cell / 2] = _times[cell];
+    }
+    _times.resize((_times.size() + 1) / 2);
+}
+
+Time SeriesStore::cellTime(std::uint64_t packet) const {
+    const auto cell = static_cast<std::size_t>((packet - 1) >> _shift);
+    return _times.empty() ? Time() : _times[std::min(cell, _times.size() - 1)];
+}
+
+std::vector<Bucket> SeriesStore::buckets(FieldIndex field, EntryId entry,
+                                         const std::vector<std::uint64_t>& borders) const {
+    std::vector<Bucket> buckets;
+    for (std::size_t index = 0; index + 1 < borders.size(); ++index) {
+        buckets.push_back({borders[index], borders[index + 1], cellTime(borders[index])});
+    }
+    const Series* series = nullptr;
+    if (entry == kNoEntry) {
+        series = field < _plain.size() ? _plain[field] : nullptr;
+    } else if (const auto found = _ofEntries.find(keyOf(field, entry)); found != _ofEntries.end()) {
+        series = found->second;
+    }
+    if (series == nullptr) {
+        return buckets;
+    }
+    auto bucket = buckets.begin();
+    for (const Run& run : series->runs) {
+        const std::uint64_t from = (std::uint64_t{run.from} << _shift) + 1;
+        const std::uint64_t to = ((std::uint64_t{run.to} + 1) << _shift) + 1;
+        while (bucket != buckets.end() && bucket->to <= from) {
+            ++bucket;
+        }
+        for (auto each = bucket; each != buckets.end() && each->from < to; ++each) {
+            each->add(Bucket{0, 0, {}, run.first, run.least, run.most, run.last});
+        }
+    }
+    return buckets;
+}
+
+std::vector<EntryId> SeriesStore::entriesOf(FieldIndex field) const {
+    std::vector<EntryId> entries;
+    for (const auto& [key, series] : _ofEntries) {
+        if (key >> 32U == field) {
+            entries.push_back(series->entry);
+        }
+    }
+    std::sort(entries.begin(), entries.end());
+    return entries;
+}
+
+} // namespace pallax

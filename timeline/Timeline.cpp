@@ -1,0 +1,166 @@
+#include "timeline/Timeline.h"
+
+#include "timeline/Indexer.h"
+
+#include <algorithm>
+#include <limits>
+#include <stdexcept>
+#include <utility>
+
+namespace pallax {
+
+Timeline::Timeline(PacketJournal& journal, const DecodingSource& source, const Limits& limits)
+    : _journal(journal), _resources(source.resources), _source{source.technology, _resources,
+                                                               source.bundle, source.technologies},
+      _fields(source.technology, _resources), _keyFrames(limits.keyFrames), _series(limits.series),
+      _mostEvents(limits.events), _indexer(std::make_unique<Indexer>(*this, limits.pingPong)) {}
+
+Timeline::~Timeline() = default;
+
+bool Timeline::index(const MayContinue& mayContinue) {
+    return _indexer->run(mayContinue);
+}
+
+std::uint64_t Timeline::firstInstant() const {
+    const auto& keyFrames = _keyFrames.all();
+    return keyFrames.empty() ? _packets : keyFrames.front().packet;
+}
+
+const Stretch* Timeline::stretchOf(Time time) const {
+    const Stretch* begun = nullptr;
+    for (const Stretch& stretch : _stretches) {
+        if (stretch.first <= time) {
+            if (time <= stretch.latest) {
+                return &stretch;
+            }
+            begun = &stretch;
+        }
+    }
+    return begun;
+}
+
+std::optional<std::uint64_t> Timeline::instantAt(Time time) const {
+    const Stretch* stretch = stretchOf(time);
+    if (stretch == nullptr) {
+        return std::nullopt;
+    }
+    const auto& frames = _keyFrames.all();
+    std::uint64_t instant = stretch->firstPacket;
+    const std::uint64_t end =
+        stretch == &_stretches.back() ? _packets : (stretch + 1)->firstPacket - 1;
+    for (const TimelineKeyFrame& frame : frames) {
+        if (frame.packet > end) {
+            break;
+        }
+        instant = frame.latest <= time ? std::max(instant, frame.packet) : instant;
+    }
+    const auto reader = _journal.reader(instant + 1);
+    while (instant < end) {
+        const auto packet = reader->next();
+        if (!packet || packet->number > end || packet->time > time) {
+            break;
+        }
+        instant = packet->number;
+    }
+    return instant;
+}
+
+std::vector<std::string> Timeline::notes() const {
+    std::vector<std::string> notes;
+    if (_fields.isFull()) {
+        notes.emplace_back("Only the first 4,096 paths of the messages are fields.");
+    }
+    if (_entries.isFull() || _series.isFull()) {
+        notes.emplace_back("There are too many list entries to keep a series of each.");
+    }
+    if (_eventsDropped != 0) {
+        notes.push_back(std::to_string(_eventsDropped) + " earlier events are left out.");
+    }
+    if (auto trouble = _journal.trouble()) {
+        notes.push_back(std::move(*trouble));
+    }
+    return notes;
+}
+
+CurrentValues Timeline::valuesAt(std::uint64_t instant) {
+    const TimelineKeyFrame* from = _keyFrames.atOrBefore(instant);
+    if (from == nullptr) {
+        throw std::out_of_range("the journal no longer has this instant");
+    }
+    CurrentValues values = from->values;
+    Replay replay(_source);
+    replay.resume(from->decoder, from->packet);
+    advance(replay, instant, &values);
+    return values;
+}
+
+PropertyList Timeline::displayAt(std::uint64_t instant) {
+    return replayAt(instant)->displayAt({});
+}
+
+std::unique_ptr<Replay> Timeline::replayAt(std::uint64_t instant) {
+    const TimelineKeyFrame* from = _keyFrames.atOrBefore(instant);
+    if (from == nullptr) {
+        throw std::out_of_range("the journal no longer has this instant");
+    }
+    auto replay = std::make_unique<Replay>(_source);
+    replay->resume(from->decoder, from->packet);
+    advance(*replay, instant);
+    return replay;
+}
+
+namespace {
+
+/// Takes the samples of packets that are only read for what the decoder keeps of them.
+class NoSamples final : public SampleSink {
+public:
+    void sample(const Sample& /*sample*/) override {}
+    void keyRemoved(std::string_view /*key*/) override {}
+    void beginList(const SampleList& /*list*/) override {}
+    void endList() override {}
+    void beginEntry(std::size_t /*index*/, std::int64_t /*name*/) override {}
+    void endEntry() override {}
+};
+
+} // namespace
+
+void Timeline::advance(Replay& replay, std::uint64_t instant, SampleSink* sink) {
+    if (replay.packet() >= instant) {
+        return;
+    }
+    // The paths of an object stream are numbered when their samples are given.
+    NoSamples numbering;
+    SampleSink* const to = sink == nullptr && _fields.isObjectStream() ? &numbering : sink;
+    const auto reader = _journal.reader(replay.packet() + 1);
+    while (replay.packet() < instant) {
+        const auto packet = reader->next();
+        if (!packet || packet->number > instant) {
+            break;
+        }
+        replay.update(*packet, to);
+    }
+}
+
+bool Timeline::read(std::uint64_t from, std::uint64_t to, SampleSink& sink,
+                    const MayContinue& mayContinue) {
+    from = std::max(from, firstInstant() + 1);
+    to = std::min(to, _packets);
+    if (from > to) {
+        return true;
+    }
+    const auto replay = replayAt(from - 1);
+    const auto reader = _journal.reader(from);
+    while (replay->packet() < to) {
+        if (mayContinue && !mayContinue()) {
+            return false;
+        }
+        const auto packet = reader->next();
+        if (!packet || packet->number > to) {
+            break;
+        }
+        replay->update(*packet, &sink);
+    }
+    return true;
+}
+
+} // namespace pallax
