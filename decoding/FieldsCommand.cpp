@@ -40,20 +40,6 @@ std::vector<ChosenField> chosenFields(const FieldsOptions& options, const Resour
     return chosen;
 }
 
-std::string_view kindName(FieldInfo::Kind kind) {
-    switch (kind) {
-    case FieldInfo::Kind::Number:
-        return "number";
-    case FieldInfo::Kind::Label:
-        return "label";
-    case FieldInfo::Kind::Text:
-        return "text";
-    case FieldInfo::Kind::Object:
-        break;
-    }
-    return "object";
-}
-
 std::string rangeWord(const FieldInfo& field) {
     std::string word;
     if (field.least && field.most) {

@@ -249,6 +249,20 @@ const FieldInfo* FieldRegistry::named(std::string_view name) const {
     return found != _byName.end() ? &_fields[found->second] : nullptr;
 }
 
+std::string_view kindName(FieldInfo::Kind kind) {
+    switch (kind) {
+    case FieldInfo::Kind::Number:
+        return "number";
+    case FieldInfo::Kind::Label:
+        return "label";
+    case FieldInfo::Kind::Text:
+        return "text";
+    case FieldInfo::Kind::Object:
+        break;
+    }
+    return "object";
+}
+
 std::string fieldWord(std::string_view text) {
     std::string word;
     for (const char character : text) {

@@ -64,6 +64,9 @@ private:
     std::map<std::string, std::size_t, std::less<>> _byName;
 };
 
+/// "number": one word, for tables and programs.
+std::string_view kindName(FieldInfo::Kind kind);
+
 /// A part of a field's name: "serving_cell_info" for "Serving Cell Info".
 std::string fieldWord(std::string_view text);
 

@@ -25,11 +25,6 @@ bool shows(const FieldValue& value, const SampleValue& sampled) {
     return sampled.object() == nullptr && text != nullptr && text->view() == sampled.words();
 }
 
-void store(FieldValue& target, const SampleValue& value) {
-    value.showIn(target.shown);
-    target.number = numberOf(value);
-}
-
 bool isEmptied(const EntryValues& entry, std::size_t held) {
     return held == 0 && entry.values.empty();
 }
@@ -57,17 +52,24 @@ const FieldValue* CurrentValues::value(std::string_view fieldName) const {
 std::size_t CurrentValues::bytes() const {
     std::size_t bytes = sizeof(CurrentValues);
     for (const FieldValue& value : _values) {
-        bytes += sizeof(value.number) + bytesOf(value.shown);
+        bytes += sizeof(value) - sizeof(value.shown) + bytesOf(value.shown);
     }
     for (const List& list : _lists) {
         for (const Slot& slot : list.slots) {
             bytes += sizeof(Slot);
             for (const auto& [field, value] : slot.held.values) {
-                bytes += sizeof(double) + sizeof(field) + bytesOf(value.shown);
+                bytes += sizeof(value) - sizeof(value.shown) + sizeof(field) + bytesOf(value.shown);
             }
         }
     }
     return bytes;
+}
+
+void CurrentValues::store(FieldValue& target, const Sample& sample) const {
+    sample.value.showIn(target.shown);
+    target.number = numberOf(sample.value);
+    target.raw = sample.raw;
+    target.read = _time;
 }
 
 void CurrentValues::sample(const Sample& sample) {
@@ -79,7 +81,7 @@ void CurrentValues::sample(const Sample& sample) {
             _values.resize(_fields->size());
         }
         FieldValue& value = _values[field];
-        store(value, sample.value);
+        store(value, sample);
         if (_listener != nullptr) {
             _listener->valueRead(field, kNoEntry, value);
         }
@@ -101,7 +103,7 @@ void CurrentValues::sampleInEntry(Open& open, const Sample& sample) {
             open.isAnother = true;
         }
         heldField = field;
-        store(value, sample.value);
+        store(value, sample);
     }
 }
 

@@ -19,6 +19,8 @@ namespace pallax {
 struct FieldValue {
     PropertyList shown; ///< null: none
     double number = NAN;
+    std::optional<std::int64_t> raw = std::nullopt; ///< the number in the record
+    Time read = {};                                 ///< of the packet
 
     bool isEmpty() const { return shown.isNull(); }
     std::string text() const { return shown.string().value_or(shown.description()); }
@@ -73,7 +75,10 @@ public:
     void sample(const Sample& sample) override;
     void keyRemoved(std::string_view key) override;
     void beginSection(std::string_view section) override { _section = section; }
-    void beginPacket(const SamplePacket& /*packet*/) override { _section = {}; }
+    void beginPacket(const SamplePacket& packet) override {
+        _section = {};
+        _time = packet.time;
+    }
     void beginList(const SampleList& list) override;
     void endList() override;
     void beginEntry(std::size_t index, std::int64_t name) override;
@@ -108,6 +113,7 @@ private:
     };
     static constexpr std::size_t kNone = static_cast<std::size_t>(-1);
 
+    void store(FieldValue& target, const Sample& sample) const;
     void sampleInEntry(Open& open, const Sample& sample);
     std::size_t placeOf(ListId id, std::size_t outer);
     void empty(std::size_t place);
@@ -128,6 +134,7 @@ private:
     bool _hasInnerLists = false;
     std::vector<Open> _open;
     std::string_view _section;
+    Time _time; ///< of the packet
 };
 
 } // namespace pallax

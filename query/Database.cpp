@@ -1,0 +1,173 @@
+#include "query/Database.h"
+
+#include "query/Quantile.h"
+#include "query/QueryTable.h"
+#include "query/VirtualTable.h"
+
+#include <algorithm>
+#include <sqlite3.h>
+#include <stdexcept>
+
+namespace pallax {
+
+namespace {
+
+/// Of the memory of all queries.
+constexpr sqlite3_int64 kMostMemory = sqlite3_int64{256} << 20U;
+/// Of a text or a query.
+constexpr int kLongestText = 16 << 20;
+constexpr int kStepsBetweenQuestions = 4000;
+
+/// Allows what only reads. It is asked while a query is prepared; a table that is opened then is
+/// declared meanwhile.
+int authorize(void* isDeclaring, int action, const char* /*first*/, const char* second,
+              const char* /*schema*/, const char* /*inner*/) {
+    if (*static_cast<bool*>(isDeclaring)) {
+        return SQLITE_OK;
+    }
+    switch (action) {
+    case SQLITE_SELECT:
+    case SQLITE_READ:
+    case SQLITE_RECURSIVE:
+        return SQLITE_OK;
+    case SQLITE_FUNCTION:
+        return std::string_view(second != nullptr ? second : "") == "load_extension" ? SQLITE_DENY
+                                                                                     : SQLITE_OK;
+    default:
+        return SQLITE_DENY;
+    }
+}
+
+int askWhetherToStop(void* mayContinue) {
+    return (*static_cast<std::function<bool()>*>(mayContinue))() ? 0 : 1;
+}
+
+QueryError errorOf(sqlite3& connection) {
+    const int place = sqlite3_error_offset(&connection);
+    const int code = sqlite3_errcode(&connection);
+    std::string sentence = code == SQLITE_AUTH        ? "A query can only read."
+                           : code == SQLITE_INTERRUPT ? "The query was stopped."
+                                                      : sqlite3_errmsg(&connection);
+    return {std::move(sentence),
+            place >= 0 ? std::optional(static_cast<std::size_t>(place)) : std::nullopt};
+}
+
+void run(sqlite3& connection, const std::string& text) {
+    if (sqlite3_exec(&connection, text.c_str(), nullptr, nullptr, nullptr) != SQLITE_OK) {
+        throw std::runtime_error(sqlite3_errmsg(&connection));
+    }
+}
+
+QueryValue valueOf(sqlite3_stmt& statement, int column) {
+    switch (sqlite3_column_type(&statement, column)) {
+    case SQLITE_INTEGER:
+        return std::int64_t{sqlite3_column_int64(&statement, column)};
+    case SQLITE_FLOAT:
+        return sqlite3_column_double(&statement, column);
+    case SQLITE_NULL:
+        return {};
+    default: {
+        const auto* text = static_cast<const char*>(sqlite3_column_blob(&statement, column));
+        const int length = sqlite3_column_bytes(&statement, column);
+        return text != nullptr ? std::string(text, static_cast<std::size_t>(length))
+                               : std::string();
+    }
+    }
+}
+
+} // namespace
+
+void Query::Finalize::operator()(sqlite3_stmt* statement) const {
+    sqlite3_finalize(statement);
+}
+
+Query::Query(sqlite3& connection, std::unique_ptr<sqlite3_stmt, Finalize> statement)
+    : _connection(&connection), _statement(std::move(statement)) {
+    const int count = sqlite3_column_count(_statement.get());
+    for (int column = 0; column < count; ++column) {
+        _columns.emplace_back(sqlite3_column_name(_statement.get(), column));
+    }
+}
+
+Result<std::optional<std::vector<QueryValue>>, QueryError> Query::next() {
+    using Row = std::optional<std::vector<QueryValue>>;
+    const int result = sqlite3_step(_statement.get());
+    if (result == SQLITE_DONE) {
+        return Row();
+    }
+    if (result != SQLITE_ROW) {
+        return errorOf(*_connection);
+    }
+    std::vector<QueryValue> row;
+    row.reserve(_columns.size());
+    for (std::size_t column = 0; column < _columns.size(); ++column) {
+        row.push_back(valueOf(*_statement, static_cast<int>(column)));
+    }
+    return Row(std::move(row));
+}
+
+void Database::Close::operator()(sqlite3* connection) const {
+    sqlite3_close_v2(connection);
+}
+
+Database::Database() : _schemas{"main"} {
+    sqlite3* connection = nullptr;
+    const int result = sqlite3_open_v2(":memory:", &connection,
+                                       SQLITE_OPEN_READWRITE | SQLITE_OPEN_MEMORY, nullptr);
+    _connection.reset(connection);
+    if (result != SQLITE_OK) {
+        throw std::runtime_error("no memory for queries");
+    }
+    sqlite3_hard_heap_limit64(kMostMemory);
+    sqlite3_limit(connection, SQLITE_LIMIT_LENGTH, kLongestText);
+    sqlite3_limit(connection, SQLITE_LIMIT_SQL_LENGTH, kLongestText);
+    if (!addQuantile(*connection)) {
+        throw std::runtime_error(sqlite3_errmsg(connection));
+    }
+}
+
+Database::~Database() = default;
+
+void Database::add(const std::string& schema, const std::string& name,
+                   std::unique_ptr<QueryTable> table) {
+    sqlite3_set_authorizer(_connection.get(), nullptr, nullptr);
+    if (std::find(_schemas.begin(), _schemas.end(), schema) == _schemas.end()) {
+        run(*_connection, "ATTACH ':memory:' AS \"" + schema + "\"");
+        _schemas.push_back(schema);
+    }
+    _tables.push_back(std::move(table));
+    _added.push_back(std::make_unique<AddedTable>(AddedTable{*_tables.back(), _isDeclaring}));
+    const std::string qualified = "\"" + schema + "\".\"" + name + "\"";
+    if (!addVirtualTable(*_connection, qualified.c_str(), *_added.back())) {
+        throw std::runtime_error(sqlite3_errmsg(_connection.get()));
+    }
+}
+
+void Database::setMayContinue(std::function<bool()> mayContinue) {
+    _mayContinue = std::move(mayContinue);
+    sqlite3_progress_handler(_connection.get(), _mayContinue ? kStepsBetweenQuestions : 0,
+                             askWhetherToStop, &_mayContinue);
+}
+
+Result<Query, QueryError> Database::prepare(std::string_view text) {
+    sqlite3_set_authorizer(_connection.get(), authorize, &_isDeclaring);
+    sqlite3_stmt* statement = nullptr;
+    const char* rest = nullptr;
+    const auto length = static_cast<int>(std::min<std::size_t>(text.size(), kLongestText));
+    const int result =
+        sqlite3_prepare_v2(_connection.get(), text.data(), length, &statement, &rest);
+    std::unique_ptr<sqlite3_stmt, Query::Finalize> owned(statement);
+    if (result != SQLITE_OK) {
+        return errorOf(*_connection);
+    }
+    if (!owned) {
+        return QueryError{"There is no query.", std::nullopt};
+    }
+    const auto end = static_cast<std::size_t>(rest - text.data());
+    if (text.find_first_not_of(" \t\r\n;", end) != std::string_view::npos) {
+        return QueryError{"Only one query can be run.", end};
+    }
+    return Query(*_connection, std::move(owned));
+}
+
+} // namespace pallax

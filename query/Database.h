@@ -1,0 +1,86 @@
+#pragma once
+
+#include "text/Result.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <variant>
+#include <vector>
+
+struct sqlite3;
+struct sqlite3_stmt;
+
+namespace pallax {
+
+class QueryTable;
+struct AddedTable;
+
+/// Why a query cannot be run or has been stopped.
+struct QueryError {
+    std::string sentence;
+    std::optional<std::size_t> place; ///< in the text of the query, in bytes
+};
+
+/// A value of a result: NULL, an integer, a real number, or a text.
+using QueryValue = std::variant<std::monostate, std::int64_t, double, std::string>;
+
+/// A query that runs.
+class Query {
+public:
+    /// The names of the columns.
+    const std::vector<std::string>& columns() const { return _columns; }
+    /// The next row; nothing after the last.
+    Result<std::optional<std::vector<QueryValue>>, QueryError> next();
+
+private:
+    friend class Database;
+    struct Finalize {
+        void operator()(sqlite3_stmt* statement) const;
+    };
+    Query(sqlite3& connection, std::unique_ptr<sqlite3_stmt, Finalize> statement);
+
+    sqlite3* _connection;
+    std::unique_ptr<sqlite3_stmt, Finalize> _statement;
+    std::vector<std::string> _columns;
+};
+
+/// Tables to be asked in SQL. Queries can only read: whatever would write, attach a file, load an
+/// extension or set something is refused.
+class Database {
+public:
+    /// Throws std::runtime_error without memory.
+    Database();
+    ~Database();
+    Database(const Database&) = delete;
+    Database& operator=(const Database&) = delete;
+
+    /// Adds a table under `schema`.`name`; "main" is the schema that is always there. Throws
+    /// std::runtime_error if there is such a table.
+    void add(const std::string& schema, const std::string& name, std::unique_ptr<QueryTable> table);
+    /// Asked every few thousand steps of a query; false stops it.
+    void setMayContinue(std::function<bool()> mayContinue);
+
+    /// Prepares the one query in `text`. The database must outlive it.
+    Result<Query, QueryError> prepare(std::string_view text);
+
+private:
+    struct Close {
+        void operator()(sqlite3* connection) const;
+    };
+
+    // These outlive the connection.
+    std::vector<std::unique_ptr<QueryTable>> _tables;
+    std::vector<std::unique_ptr<AddedTable>> _added;
+    bool _isDeclaring = false;
+
+    std::unique_ptr<sqlite3, Close> _connection;
+    std::vector<std::string> _schemas;
+    std::function<bool()> _mayContinue;
+};
+
+} // namespace pallax

@@ -1,0 +1,78 @@
+#include "query/Quantile.h"
+
+#include <algorithm>
+#include <memory>
+#include <sqlite3.h>
+#include <utility>
+#include <vector>
+
+namespace pallax {
+
+namespace {
+
+struct Weighted {
+    std::vector<std::pair<double, double>> values; ///< with their weights
+    double share = 0;
+};
+
+bool isNumber(sqlite3_value* value) {
+    const int type = sqlite3_value_type(value);
+    return type == SQLITE_INTEGER || type == SQLITE_FLOAT;
+}
+
+/// SQLite keeps only bytes for a group, all zero at first: a pointer.
+Weighted** weightedOf(sqlite3_context* context, bool isNew) {
+    return static_cast<Weighted**>(
+        sqlite3_aggregate_context(context, isNew ? static_cast<int>(sizeof(Weighted*)) : 0));
+}
+
+void step(sqlite3_context* context, int /*count*/, sqlite3_value** arguments) {
+    Weighted** held = weightedOf(context, true);
+    if (held == nullptr) {
+        return sqlite3_result_error_nomem(context);
+    }
+    if (*held == nullptr) {
+        *held = std::make_unique<Weighted>().release();
+    }
+    const double weight = sqlite3_value_double(arguments[1]);
+    if (isNumber(arguments[0]) && weight > 0) {
+        (*held)->values.emplace_back(sqlite3_value_double(arguments[0]), weight);
+    }
+    (*held)->share = sqlite3_value_double(arguments[2]);
+}
+
+void finish(sqlite3_context* context) {
+    Weighted** held = weightedOf(context, false);
+    if (held == nullptr || *held == nullptr) {
+        return; // NULL
+    }
+    const std::unique_ptr<Weighted> weighted(std::exchange(*held, nullptr));
+    auto& values = weighted->values;
+    if (values.empty()) {
+        return;
+    }
+    std::sort(values.begin(), values.end());
+    double all = 0;
+    for (const auto& [value, weight] : values) {
+        all += weight;
+    }
+    double sum = 0;
+    for (const auto& [value, weight] : values) {
+        sum += weight;
+        if (sum >= weighted->share * all) {
+            return sqlite3_result_double(context, value);
+        }
+    }
+    sqlite3_result_double(context, values.back().first);
+}
+
+} // namespace
+
+bool addQuantile(sqlite3& connection) {
+    constexpr int kArguments = 3;
+    return sqlite3_create_function_v2(&connection, "quantile", kArguments,
+                                      SQLITE_UTF8 | SQLITE_DETERMINISTIC, nullptr, nullptr, step,
+                                      finish, nullptr) == SQLITE_OK;
+}
+
+} // namespace pallax

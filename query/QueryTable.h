@@ -1,0 +1,73 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <limits>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+struct sqlite3_context;
+
+namespace pallax {
+
+/// A column, and what a condition on it says about the rows that are needed.
+struct Column {
+    enum class Role {
+        Value,  ///< nothing
+        Time,   ///< UTC in microseconds: where in the recording they are
+        Packet, ///< likewise, by the packet's number
+        Field,  ///< of which field they tell, by its name
+    };
+
+    std::string name;
+    std::string_view type; ///< of SQL; empty if values of any type come
+    Role role = Role::Value;
+    bool isHidden = false; ///< given only where a query names it
+};
+
+/// The rows that a query may need. Tables may give others, too, which SQLite then leaves out.
+struct RowBounds {
+    std::uint64_t firstPacket = 0;
+    std::uint64_t lastPacket = std::numeric_limits<std::uint64_t>::max();
+    std::int64_t leastTime = std::numeric_limits<std::int64_t>::min(); ///< as in the column
+    std::int64_t mostTime = std::numeric_limits<std::int64_t>::max();
+    std::optional<std::string> field;
+};
+
+/// Takes the value of one column. What is not given is NULL.
+class ColumnValue {
+public:
+    explicit ColumnValue(sqlite3_context& context) : _context(context) {}
+
+    void integer(std::int64_t number);
+    void real(double number);
+    void text(std::string_view text);
+
+private:
+    sqlite3_context& _context;
+};
+
+/// The rows of a table for one run of a query.
+class Rows {
+public:
+    virtual ~Rows() = default;
+    /// Goes to the next row, at first to the first one; false after the last.
+    virtual bool next() = 0;
+    /// Gives the value of a column of the current row, by its place in the table's columns.
+    virtual void give(std::size_t column, ColumnValue& value) const = 0;
+};
+
+/// A table over what is already there.
+class QueryTable {
+public:
+    virtual ~QueryTable() = default;
+    virtual const std::vector<Column>& columns() const = 0;
+    virtual std::unique_ptr<Rows> rows(const RowBounds& bounds) = 0;
+    /// About how many rows there are without bounds.
+    virtual double expectedRows() const = 0;
+};
+
+} // namespace pallax

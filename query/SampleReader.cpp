@@ -1,0 +1,43 @@
+#include "query/SampleReader.h"
+
+namespace pallax {
+
+namespace {
+
+/// So many that starting again costs little, and so few that the items stay in the caches.
+constexpr std::size_t kItemsAtOnce = 512;
+
+} // namespace
+
+SampleReader::SampleReader(Timeline& timeline, const PacketRange& range,
+                           std::optional<FieldIndex> field)
+    : _last(range.last), _field(field), _values(timeline.fieldTable(), timeline.entryTable()) {
+    _values.setListener(this);
+    if (range.first <= range.last) {
+        _replay = timeline.replayAt(range.first - 1);
+        _reader = timeline.journal().reader(range.first);
+    }
+}
+
+bool SampleReader::readMore() {
+    _items.clear();
+    _gone.clear();
+    while (_replay && _items.size() < kItemsAtOnce) {
+        const auto packet = _reader->next();
+        if (!packet || packet->number > _last) {
+            _replay.reset();
+            break;
+        }
+        _packet = *packet;
+        _replay->update(*packet, &_values);
+    }
+    return !_items.empty() || !_gone.empty() || _replay;
+}
+
+void SampleReader::valueRead(FieldIndex field, EntryId entry, const FieldValue& value) {
+    if (!_field || *_field == field) {
+        _items.push_back({_packet.number, _packet.time, field, entry, value});
+    }
+}
+
+} // namespace pallax

@@ -1,0 +1,61 @@
+#pragma once
+
+#include "query/TimelineTables.h"
+#include "timeline/Timeline.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <vector>
+
+namespace pallax {
+
+/// Reads the samples of packets again, a few packets at a time.
+class SampleReader final : private CurrentValues::Listener {
+public:
+    struct Item {
+        std::uint64_t packet;
+        Time time;
+        FieldIndex field;
+        EntryId entry; ///< kNoEntry outside lists
+        FieldValue value;
+    };
+    /// A list that begins anew, or a field that is gone, before the item with that index.
+    struct Gone {
+        std::size_t before;
+        std::uint64_t packet;
+        Time time;
+        std::optional<FieldIndex> field; ///< nothing: a list
+        ListId list = 0;
+    };
+
+    /// Only the samples of `field`, if there is one. The timeline must outlive the reader.
+    SampleReader(Timeline& timeline, const PacketRange& range,
+                 std::optional<FieldIndex> field = std::nullopt);
+
+    /// Replaces the items by those of the next packets that have any; false at the end.
+    bool readMore();
+    const std::vector<Item>& items() const { return _items; }
+    const std::vector<Gone>& gone() const { return _gone; }
+
+private:
+    void valueRead(FieldIndex field, EntryId entry, const FieldValue& value) override;
+    void valueRemoved(FieldIndex field) override {
+        _gone.push_back({_items.size(), _packet.number, _packet.time, field});
+    }
+    void listReplaced(ListId list) override {
+        _gone.push_back({_items.size(), _packet.number, _packet.time, std::nullopt, list});
+    }
+
+    std::uint64_t _last;
+    std::optional<FieldIndex> _field;
+    std::unique_ptr<Replay> _replay; ///< null if there is nothing to read
+    std::unique_ptr<PacketReader> _reader;
+    CurrentValues _values;
+    JournalPacket _packet;
+    std::vector<Item> _items;
+    std::vector<Gone> _gone;
+};
+
+} // namespace pallax

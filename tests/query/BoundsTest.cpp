@@ -1,0 +1,85 @@
+#include "tests/query/QueryFixture.h"
+
+namespace pallax {
+namespace {
+
+/// What a query finds with bounds that a table uses is what it finds with the same conditions in a
+/// form that no table knows (+column).
+class BoundsTest : public testing::TestWithParam<const char*> {
+protected:
+    QueryFixture _fixture{GetParam(), 3, std::chrono::seconds(12)};
+
+    void holdsFor(const std::string& table, const std::string& columns) {
+        namespace any = doubles::any;
+        EXPECT_TRUE(doubles::holds([&] {
+            const std::int64_t start = microseconds(Simulation::kStart);
+            const std::int64_t from = start + any::longBetween(-2'000'000, 14'000'000);
+            const std::int64_t to = from + any::longBetween(-1'000'000, 8'000'000);
+            const std::string first = std::to_string(any::between(0, 550));
+            const std::string last = std::to_string(any::between(0, 550));
+            const auto ask = [&](const std::string& sign) {
+                std::string text = "select " + columns + " from " + table + " where 1";
+                text += " and " + sign + "time >= " + std::to_string(from);
+                text += " and " + sign + "time < " + std::to_string(to);
+                if (_withPackets) {
+                    text += " and " + sign + "packet > " + first;
+                    text += " and " + sign + "packet <= " + last;
+                }
+                return _fixture.ask(text);
+            };
+            _withPackets = any::boolean();
+            RC_ASSERT(ask("") == ask("+"));
+        }));
+    }
+
+    bool _withPackets = false;
+};
+
+INSTANTIATE_TEST_SUITE_P(All, BoundsTest, testing::ValuesIn(technologyNames()));
+
+TEST_P(BoundsTest, OfPacketsLeaveNothingOut) {
+    holdsFor("packet", "time, packet, length, code");
+}
+
+TEST_P(BoundsTest, OfSamplesLeaveNothingOut) {
+    holdsFor("sample", "count(*), sum(packet), sum(number), min(time), max(time), sum(raw)");
+}
+
+TEST_P(BoundsTest, OfTheStateLeaveNothingOut) {
+    holdsFor("state", "*");
+}
+
+TEST_P(BoundsTest, AFieldIsLookedForByItsName) {
+    const auto fields = _fixture.ask("select distinct field from sample limit 5");
+    ASSERT_FALSE(fields.empty());
+    for (const std::string& field : fields) {
+        for (const char* table : {"sample", "span"}) {
+            const std::string select = std::string("select count(*), sum(packet) from ") + table;
+            EXPECT_EQ(_fixture.ask(select + " where field = '" + field + "'"),
+                      _fixture.ask(select + " where +field = '" + field + "'"));
+        }
+    }
+    EXPECT_EQ(_fixture.ask("select count(*) from sample where field = 'nothing'"),
+              std::vector<std::string>{"0"});
+}
+
+TEST(TimesThatComeTwice, AreFoundInBothStretches) {
+    QueryFixture fixture("lte", 3, std::chrono::seconds(10));
+    TimelineFixture twice("lte");
+    twice.drive(3, std::chrono::seconds(10));
+    twice.drive(3, std::chrono::seconds(10));
+    const auto timeline = twice.indexed();
+    Database database;
+    addTimelineTables(database, *timeline);
+    ASSERT_EQ(timeline->stretches().size(), 2U);
+    const std::string from = std::to_string(microseconds(Simulation::kStart) + 4'000'000);
+    const std::string select =
+        "select count(*) from packet where time between " + from + " and " + from + " + 2000000";
+    const auto once = fixture.ask(select);
+    ASSERT_NE(once, std::vector<std::string>{"0"});
+    EXPECT_EQ(linesOf(database, select),
+              std::vector<std::string>{std::to_string(2 * std::stoi(once[0]))});
+}
+
+} // namespace
+} // namespace pallax

@@ -1,0 +1,201 @@
+#include "query/QueryTable.h"
+#include "tests/query/QueryFixture.h"
+
+namespace pallax {
+namespace {
+
+/// The numbers from 1 to 10, as packets; counts the rows that it was asked for.
+class Numbers final : public QueryTable {
+public:
+    explicit Numbers(int& given) : _given(given) {}
+
+    const std::vector<Column>& columns() const override {
+        static const std::vector<Column> columns = {{"number", "INTEGER", Column::Role::Packet},
+                                                    {"name", "TEXT"},
+                                                    {"secret", "TEXT", Column::Role::Value, true}};
+        return columns;
+    }
+    std::unique_ptr<Rows> rows(const RowBounds& bounds) override {
+        return std::make_unique<Counting>(bounds, _given);
+    }
+    double expectedRows() const override { return kMost; }
+
+    static constexpr std::uint64_t kMost = 10;
+
+private:
+    class Counting final : public Rows {
+    public:
+        Counting(const RowBounds& bounds, int& given)
+            : _number(std::max<std::uint64_t>(bounds.firstPacket, 1) - 1),
+              _last(std::min(bounds.lastPacket, kMost)), _given(given) {}
+        bool next() override {
+            ++_given;
+            if (++_number == kTrouble && _last == kMost) {
+                return true;
+            }
+            return _number <= _last;
+        }
+        void give(std::size_t column, ColumnValue& value) const override {
+            if (column == 0) {
+                value.integer(static_cast<std::int64_t>(_number));
+            } else if (column == 1) {
+                value.text("n" + std::to_string(_number));
+            } else {
+                value.real(0.5);
+            }
+        }
+
+    private:
+        static constexpr std::uint64_t kTrouble = 100;
+        std::uint64_t _number;
+        std::uint64_t _last;
+        int& _given;
+    };
+
+    int& _given;
+};
+
+/// Throws when its rows are asked for, or when the first one is.
+class Failing final : public QueryTable {
+public:
+    explicit Failing(bool late) : _late(late) {}
+    const std::vector<Column>& columns() const override {
+        static const std::vector<Column> columns = {{"value", ""}};
+        return columns;
+    }
+    std::unique_ptr<Rows> rows(const RowBounds& /*bounds*/) override {
+        if (!_late) {
+            throw std::runtime_error("no rows");
+        }
+        return std::make_unique<NoNext>();
+    }
+    double expectedRows() const override { return 1; }
+
+private:
+    class NoNext final : public Rows {
+    public:
+        bool next() override { throw std::runtime_error("no next row"); }
+        void give(std::size_t /*column*/, ColumnValue& /*value*/) const override {}
+    };
+    bool _late;
+};
+
+class DatabaseTest : public testing::Test {
+protected:
+    DatabaseTest() { _database.add("main", "numbers", std::make_unique<Numbers>(_given)); }
+
+    std::vector<std::string> ask(const std::string& text) { return linesOf(_database, text); }
+    int rowsGivenFor(const std::string& text) {
+        _given = 0;
+        (void)ask(text);
+        return _given;
+    }
+
+    Database _database;
+    int _given = 0;
+};
+
+using Lines = std::vector<std::string>;
+
+TEST_F(DatabaseTest, GivesTheRowsOfATable) {
+    EXPECT_EQ(ask("select number, name from numbers where number < 3"), (Lines{"1|n1", "2|n2"}));
+    EXPECT_EQ(ask("select count(*) from numbers"), Lines{"10"});
+    EXPECT_EQ(ask("select * from numbers limit 1"), Lines{"1|n1"}) << "hidden columns are left out";
+    EXPECT_EQ(ask("select secret from numbers limit 1"), Lines{"0.500000"});
+}
+
+TEST_F(DatabaseTest, AsksATableOnlyForTheRowsThatAQueryNeeds) {
+    EXPECT_EQ(rowsGivenFor("select * from numbers"), 11);
+    EXPECT_EQ(rowsGivenFor("select * from numbers where number = 4"), 2);
+    EXPECT_EQ(rowsGivenFor("select * from numbers where number between 3 and 5"), 4);
+    EXPECT_EQ(rowsGivenFor("select * from numbers where number > 8.5 and name like 'n%'"), 5);
+    EXPECT_EQ(rowsGivenFor("select * from numbers where name = 'n3'"), 11);
+}
+
+TEST_F(DatabaseTest, ChecksConditionsThatATableOnlyComesNear) {
+    EXPECT_EQ(ask("select number from numbers where number > 8.5"), (Lines{"9", "10"}));
+    EXPECT_EQ(ask("select number from numbers where number < 2.5"), (Lines{"1", "2"}));
+    EXPECT_EQ(ask("select number from numbers where number = '3'"), Lines{"3"});
+    EXPECT_EQ(ask("select number from numbers where number = null"), Lines{});
+    EXPECT_EQ(ask("select number from numbers where number > 1e300"), Lines{});
+    EXPECT_EQ(ask("select count(*) from numbers where number > -1e300"), Lines{"10"});
+    EXPECT_EQ(ask("select count(*) from numbers where number < 1e300"), Lines{"10"});
+}
+
+TEST_F(DatabaseTest, TakesTheNameOfAFieldForAnExpression) {
+    int given = 0;
+    _database.add("lte", "cells", std::make_unique<Numbers>(given));
+    EXPECT_EQ(ask("select lte.cells.number from cells where lte.cells.number = 2"), Lines{"2"});
+}
+
+TEST_F(DatabaseTest, RefusesEverythingThatWouldDoMoreThanRead) {
+    const Lines refused{"A query can only read."};
+    for (const char* text :
+         {"attach 'x.db' as x", "create table t(a)", "pragma journal_mode", "drop table numbers",
+          "insert into numbers values (1, 'x')", "delete from numbers", "vacuum",
+          "select load_extension('x')", "begin", "create temp table t(a)", "detach lte",
+          "update numbers set name = 'x'", "analyze"}) {
+        const Lines answer = ask(text);
+        ASSERT_EQ(answer.size(), 1U) << text;
+        EXPECT_TRUE(answer == refused ||
+                    answer[0].find("may not be modified") != std::string::npos ||
+                    answer[0].find("not authorized") != std::string::npos)
+            << text << ": " << answer[0];
+    }
+    EXPECT_EQ(ask("select count(*) from numbers"), Lines{"10"});
+}
+
+TEST_F(DatabaseTest, TellsWhatIsWrongWithAQueryAndWhere) {
+    const auto error = [&](const std::string& text) {
+        const auto query = _database.prepare(text);
+        EXPECT_FALSE(query) << text;
+        return query ? QueryError{} : query.error();
+    };
+    const QueryError column = error("select numbr from numbers");
+    EXPECT_EQ(column.sentence, "no such column: numbr");
+    EXPECT_EQ(column.place, 7U);
+    EXPECT_EQ(error("select from").sentence, "near \"from\": syntax error");
+    EXPECT_EQ(error("select * from cellar").sentence, "no such table: cellar");
+    EXPECT_EQ(error("  ").sentence, "There is no query.");
+    const QueryError second = error("select 1; select 2");
+    EXPECT_EQ(second.sentence, "Only one query can be run.");
+    EXPECT_EQ(second.place, 9U);
+    EXPECT_TRUE(_database.prepare("select 1 ; ")) << "an empty rest is no query";
+}
+
+TEST_F(DatabaseTest, TellsWhyATableHasFailed) {
+    _database.add("main", "early", std::make_unique<Failing>(false));
+    _database.add("main", "late", std::make_unique<Failing>(true));
+    EXPECT_EQ(ask("select * from early"), Lines{"no rows"});
+    EXPECT_EQ(ask("select * from late"), Lines{"no next row"});
+}
+
+TEST_F(DatabaseTest, StopsAQueryWhenItIsAskedTo) {
+    int asked = 0;
+    _database.setMayContinue([&] { return ++asked < 3; });
+    EXPECT_EQ(ask("with recursive c(n) as (select 1 union all select n + 1 from c) "
+                  "select count(*) from c"),
+              Lines{"The query was stopped."});
+    EXPECT_EQ(asked, 3);
+}
+
+TEST_F(DatabaseTest, AQueryThatWantsTooMuchMemoryFailsAndNothingElse) {
+    const Lines answer = ask("select length(hex(zeroblob(1 << 30)))");
+    ASSERT_EQ(answer.size(), 1U);
+    EXPECT_NE(answer[0], "2147483648");
+    EXPECT_EQ(ask("select 1"), Lines{"1"});
+}
+
+TEST_F(DatabaseTest, QuantilesAreWeighted) {
+    EXPECT_EQ(ask("select quantile(number, 1, 0.5) from numbers"), Lines{"5.000000"});
+    EXPECT_EQ(ask("select quantile(number, 1, 0), quantile(number, 1, 1) from numbers"),
+              Lines{"1.000000|10.000000"});
+    EXPECT_EQ(ask("select quantile(number, number = 7, 0.5) from numbers"), Lines{"7.000000"});
+    EXPECT_EQ(ask("select quantile(name, 1, 0.5) from numbers"), Lines{"NULL"});
+    EXPECT_EQ(ask("select quantile(number, 1, 0.5) from numbers where number < 1"), Lines{"NULL"});
+    EXPECT_EQ(ask("select number % 2, quantile(number, 1, 0.5) from numbers group by 1"),
+              (Lines{"0|6.000000", "1|5.000000"}));
+}
+
+} // namespace
+} // namespace pallax
