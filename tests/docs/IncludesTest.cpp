@@ -34,6 +34,7 @@ const std::vector<Layer>& layers() {
         {"plist", {"text"}},
         {"platform", {"text", "plist"}},
         {"timeline", {"text"}},
+        {"knowledge", {"text"}},
         {"platform/ui", {"text", "plist", "platform"}},
         {records, {"text", "plist", "platform"}},
         {generators, {"text", "plist", "platform", records}},
