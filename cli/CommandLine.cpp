@@ -5,7 +5,7 @@
 #include "cli/ManualPage.h"
 #include "cli/OptionParts.h"
 #include "cli/SimulateOptions.h"
-#include "cli/Suggestion.h"
+#include "text/Suggestion.h"
 
 #include <CLI/CLI.hpp>
 

@@ -1,11 +1,11 @@
 #include "link/Settings.h"
 
 #include "host/Files.h"
+#include "host/UserFolders.h"
 #include "text/Format.h"
 #include "text/KeyValues.h"
 
 #include <charconv>
-#include <cstdlib>
 #include <filesystem>
 #include <system_error>
 
@@ -90,12 +90,8 @@ std::vector<std::string> settingsFiles() {
     const auto add = [&files](const std::filesystem::path& folder) {
         files.push_back((folder / kFile).string());
     };
-    const char* configuration = std::getenv("XDG_CONFIG_HOME");
-    const char* home = std::getenv("HOME");
-    if (configuration != nullptr && *configuration == '/') {
-        add(configuration);
-    } else if (home != nullptr && *home != '\0') {
-        add(std::filesystem::path(home) / ".config");
+    if (const auto folder = configurationFolder()) {
+        add(*folder);
     }
     add(kSystemFolder);
     return files;
