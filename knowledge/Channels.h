@@ -47,6 +47,8 @@ struct BandPart {
     struct Range {
         Channel first;
         Channel last;
+
+        friend bool operator==(const Range&, const Range&) = default;
     };
     std::optional<Range> downlink;
     std::optional<Range> uplink;
