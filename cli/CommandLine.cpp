@@ -5,7 +5,7 @@
 #include "cli/ManualPage.h"
 #include "cli/OptionParts.h"
 #include "cli/SimulateOptions.h"
-#include "cli/Suggestion.h"
+#include "text/Suggestion.h"
 
 #include <CLI/CLI.hpp>
 
@@ -90,6 +90,8 @@ CommandLine::CommandLine()
     addSimulate(addCommand("simulate", "Write a simulated modem's packets to a recording"),
                 _simulate);
     addFields(addCommand("fields", "List every field of the display"), _fields);
+    addExplain(addCommand("explain", "Explain a channel, a network code, a field or a value"),
+               _explain);
     addTexts();
 }
 
@@ -190,6 +192,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("fields")) {
         return _fields;
+    }
+    if (_app->got_subcommand("explain")) {
+        return _explain;
     }
     return _browse;
 }

@@ -36,6 +36,7 @@ private:
     BrowseOptions _browse;
     BrowseOptions _demo;
     DecodeOptions _decode;
+    ExplainOptions _explain;
     FieldsOptions _fields;
     RecordOptions _record;
     ServiceRequest _service;

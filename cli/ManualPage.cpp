@@ -16,7 +16,10 @@ constexpr const char* kSurroundings = R"(.SH ENVIRONMENT
 Its folder pallax contains the sockets that connect viewers and the service.
 .TP
 .B XDG_CONFIG_HOME
-Its folder pallax contains the settings.
+Its folder pallax contains the settings and the profiles of the user.
+.TP
+.B XDG_DATA_DIRS
+Its folders are searched for the names of networks and countries.
 .TP
 .B PALLAX_RESOURCES
 The folder of the display templates, if not in the installation.
@@ -30,6 +33,9 @@ The user's settings.
 .TP
 .I /etc/xdg/pallax/pallax.conf
 The system's settings, read if the user has none.
+.TP
+.I ~/.config/pallax/profiles/NAME.conf
+The profiles of signal quality that the user has added.
 )";
 
 std::string italic(std::string_view text) {

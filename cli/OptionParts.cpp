@@ -1,7 +1,7 @@
 #include "cli/OptionParts.h"
 
-#include "cli/Suggestion.h"
 #include "telephony/Service.h"
+#include "text/Suggestion.h"
 
 #include <sstream>
 

@@ -24,6 +24,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax record drive.pcapng           record the live modem
   pallax service --play drive.pcap     play a recording to viewers
   pallax fields | grep -i rsrp         look up a field
+  pallax explain earfcn 1850           what a number, a code or a field means
 
 Each command has its own help (pallax decode --help). To open a recording with
 the name of a command, add its folder (pallax ./decode).
@@ -72,6 +73,43 @@ entry's name in the path.
 Exit status:
   0   success, or the reader of the output has gone
   1   failure: cannot read a template, or write the output
+  2   wrong usage)";
+
+constexpr const char* kExplainFooter = R"(Examples:
+  pallax explain earfcn 1850
+  pallax explain 262-01
+  pallax explain lte.serving_cell_measurements.srxlev
+  pallax explain rsrp -97 --profile field
+  pallax explain --json band lte 3
+
+WORDS are one of:
+
+Channel numbers: arfcn N (GSM), uarfcn N (UMTS and UTRA TDD), earfcn N (LTE),
+nrarfcn N (NR), cdma BANDCLASS CHANNEL; the other way, mhz SYSTEM MHZ and
+band SYSTEM BAND, where SYSTEM is gsm, umts, utran, lte, nr or cdma.
+
+Networks: 262-01, 262 01 or 26201, and mcc 262. An MNC of two digits and one of
+three are different networks. The names come from the Debian packages
+mobile-broadband-provider-info and iso-codes.
+
+Cells: cell IDENTITY (LTE or UMTS), bsic N, ta STEPS (GSM and LTE), prb BLOCKS.
+
+Fields: the name of a field or its end (srxlev), as pallax fields lists it, and
+optionally a value.
+
+Levels: rsrp, rsrq, sinr, rssi, rscp, ecno, rxlev, rxqual, cdma-rssi, evdo-rssi
+or ecio, and a value. A profile says how good it is, because no standard does:
+android (signal bars of phones), field (usual in drive tests), operator
+(stricter), or NAME for your own in ~/.config/pallax/profiles/NAME.conf, whose
+lines are like "rsrp = excellent -80, good -90, fair -100, poor -120". The
+words profile NAME show a profile's borders and their source.
+
+Words with several meanings have several answers, the likeliest first; in JSON,
+each answer is a line.
+
+Exit status:
+  0   success, or the reader of the output has gone
+  1   nothing is known about the words, or failure, as one sentence
   2   wrong usage)";
 
 constexpr const char* kRecordFooter = R"(Examples:
@@ -183,6 +221,15 @@ void addFields(CLI::App& app, FieldsOptions& options) {
     app.add_flag("--json", options.json, "JSON, one object per line");
     addTechnology(app, "TECHNOLOGY", options.technology, "Technology of the fields (default: all)");
     app.footer(kFieldsFooter);
+}
+
+void addExplain(CLI::App& app, ExplainOptions& options) {
+    app.add_flag("--json", options.json, "JSON, one object per line");
+    app.add_option("--profile", options.profile,
+                   "The profile that judges levels (default: android)")
+        ->type_name("android|field|operator|NAME");
+    app.add_option("WORDS", options.words, "What to explain")->required()->type_name("");
+    app.footer(kExplainFooter);
 }
 
 void addRecord(CLI::App& app, RecordOptions& options) {

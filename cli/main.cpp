@@ -30,6 +30,7 @@ struct Run {
     }
     ExitStatus operator()(const SimulateOptions& options) const { return runSimulate(options); }
     ExitStatus operator()(const FieldsOptions& options) const { return runFields(options); }
+    ExitStatus operator()(const ExplainOptions& options) const { return runExplain(options); }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);

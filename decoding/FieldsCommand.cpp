@@ -2,10 +2,10 @@
 
 #include "console/Output.h"
 #include "decoding/DisplayJson.h"
+#include "decoding/FieldFacts.h"
 #include "decoding/RequiredTemplates.h"
 #include "fields/FieldRegistry.h"
 #include "host/Recording.h"
-#include "text/Format.h"
 
 #include <algorithm>
 #include <array>
@@ -38,29 +38,6 @@ std::vector<ChosenField> chosenFields(const FieldsOptions& options, const Resour
         }
     }
     return chosen;
-}
-
-std::string rangeWord(const FieldInfo& field) {
-    std::string word;
-    if (field.least && field.most) {
-        appendJson(word, PropertyList::real(*field.least));
-        word += "..";
-        appendJson(word, PropertyList::real(*field.most));
-    }
-    return word;
-}
-
-std::string marksWord(const FieldInfo& field) {
-    std::string word;
-    const auto mark = [&word](bool isMarked, std::string_view name) {
-        if (isMarked) {
-            word.append(word.empty() ? "" : ",").append(name);
-        }
-    };
-    mark(field.identifies, "identity");
-    mark(field.isPersonal, "personal");
-    mark(!field.isShown, "hidden");
-    return word;
 }
 
 constexpr std::size_t kColumns = 5;
@@ -107,46 +84,9 @@ void writeColumns(const std::vector<ChosenField>& fields, Output& output) {
     }
 }
 
-PropertyList rangeOf(const FieldInfo& field) {
-    if (!field.least || !field.most) {
-        return {};
-    }
-    return Dictionary{{"least", PropertyList::real(*field.least)},
-                      {"most", PropertyList::real(*field.most)}};
-}
-
-Array codeNames(const FieldInfo& field) {
-    Array codes;
-    for (const LogCode code : field.codes) {
-        codes.emplace_back(formatText("0x%04X", {code}));
-    }
-    return codes;
-}
-
-PropertyList objectOf(const ChosenField& chosen) {
-    const FieldInfo& field = chosen.info;
-    return Dictionary{
-        {"name", field.name},
-        {"technology", std::string(chosen.technology)},
-        {"path", field.path},
-        {"section", field.section},
-        {"key", field.key},
-        {"kind", std::string(kindName(field.kind))},
-        {"unit", field.unit.empty() ? PropertyList() : PropertyList(field.unit)},
-        {"range", rangeOf(field)},
-        {"meaning", field.meaning},
-        {"labels", Array(field.labels.begin(), field.labels.end())},
-        {"codes", codeNames(field)},
-        {"identity", Array(field.identity.begin(), field.identity.end())},
-        {"identifies", PropertyList::boolean(field.identifies)},
-        {"personal", PropertyList::boolean(field.isPersonal)},
-        {"shown", PropertyList::boolean(field.isShown)},
-    };
-}
-
 void writeJson(const std::vector<ChosenField>& fields, Output& output) {
     for (const ChosenField& field : fields) {
-        appendJson(output.text(), objectOf(field));
+        appendJson(output.text(), fieldObject(field.technology, field.info));
         output.text() += '\n';
         output.lineDone();
     }

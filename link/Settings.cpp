@@ -1,11 +1,11 @@
 #include "link/Settings.h"
 
 #include "host/Files.h"
+#include "host/UserFolders.h"
 #include "text/Format.h"
+#include "text/KeyValues.h"
 
-#include <algorithm>
 #include <charconv>
-#include <cstdlib>
 #include <filesystem>
 #include <system_error>
 
@@ -15,15 +15,6 @@ namespace {
 
 constexpr std::string_view kFile = "pallax/pallax.conf";
 constexpr std::string_view kSystemFolder = "/etc/xdg";
-
-std::string_view trimmed(std::string_view text) {
-    constexpr std::string_view kBlanks = " \t\r";
-    const std::size_t start = text.find_first_not_of(kBlanks);
-    if (start == std::string_view::npos) {
-        return {};
-    }
-    return text.substr(start, text.find_last_not_of(kBlanks) - start + 1);
-}
 
 std::optional<int> logLevelIn(std::string_view text) {
     constexpr int kHighestLevel = 7;
@@ -66,27 +57,16 @@ std::optional<std::string> take(Settings& settings, std::string_view key, std::s
     return std::nullopt;
 }
 
-std::optional<std::string> takeLine(Settings& settings, std::string_view line) {
-    if (line.empty() || line.front() == '#') {
-        return std::nullopt;
-    }
-    const std::size_t equals = line.find('=');
-    if (equals == std::string_view::npos) {
-        return "a setting is written \"key = value\"";
-    }
-    return take(settings, trimmed(line.substr(0, equals)), trimmed(line.substr(equals + 1)));
-}
-
 } // namespace
 
 SettingsResult parseSettings(std::string_view text, std::string_view file) {
     Settings settings;
-    for (int number = 1; !text.empty(); ++number) {
-        const std::string_view line = text.substr(0, text.find('\n'));
-        text.remove_prefix(std::min(line.size() + 1, text.size()));
-        if (const auto reason = takeLine(settings, trimmed(line))) {
-            return SettingsError{formatText("%@, line %d: %@.", {file, number, *reason})};
-        }
+    const auto mistake =
+        readKeyValues(text, file, [&settings](std::string_view key, std::string_view value) {
+            return take(settings, key, value);
+        });
+    if (mistake) {
+        return SettingsError{*mistake};
     }
     return settings;
 }
@@ -110,12 +90,8 @@ std::vector<std::string> settingsFiles() {
     const auto add = [&files](const std::filesystem::path& folder) {
         files.push_back((folder / kFile).string());
     };
-    const char* configuration = std::getenv("XDG_CONFIG_HOME");
-    const char* home = std::getenv("HOME");
-    if (configuration != nullptr && *configuration == '/') {
-        add(configuration);
-    } else if (home != nullptr && *home != '\0') {
-        add(std::filesystem::path(home) / ".config");
+    if (const auto folder = configurationFolder()) {
+        add(*folder);
     }
     add(kSystemFolder);
     return files;

@@ -118,8 +118,8 @@ TEST(Options, ServiceRelaysStandardInput) {
 
 TEST(Options, ServiceRelaysAfterSoLongAWait) {
     using std::chrono::milliseconds;
-    const auto patience = [](const char* seconds) {
-        return parsed<ServiceOptions>({"service", "--relay", "-", "--wait", seconds}).relayPatience;
+    const auto patience = [](const char* wait) {
+        return parsed<ServiceOptions>({"service", "--relay", "-", "--wait", wait}).relayPatience;
     };
     EXPECT_EQ(patience("0"), milliseconds(0));
     EXPECT_EQ(patience("2.5"), milliseconds(2500));
@@ -236,9 +236,32 @@ TEST(Options, FieldsAreOfEveryTechnologyUnlessOneIsNamed) {
     EXPECT_EQ(ended({"fields", "lte", "gsm"}).status, kExitWrongUsage);
 }
 
+TEST(Options, ExplainTakesWordsNegativeNumbersAmongThem) {
+    const auto plain = parsed<ExplainOptions>({"explain", "rsrp", "-97"});
+    EXPECT_EQ(plain.words, (std::vector<std::string>{"rsrp", "-97"}));
+    EXPECT_EQ(plain.profile, "android");
+    EXPECT_FALSE(plain.json);
+    const auto told =
+        parsed<ExplainOptions>({"explain", "--json", "rsrp", "-97.5", "--profile", "mine"});
+    EXPECT_EQ(told.words, (std::vector<std::string>{"rsrp", "-97.5"}));
+    EXPECT_EQ(told.profile, "mine");
+    EXPECT_TRUE(told.json);
+    EXPECT_EQ(ended({"explain"}).status, kExitWrongUsage);
+}
+
+TEST(Options, TheHelpOfExplainNamesEveryTopic) {
+    const std::string help = ended({"explain", "--help"}).text;
+    for (const std::string& topic : topicNames()) {
+        EXPECT_NE(help.find(topic), std::string::npos) << topic;
+    }
+    for (const BuiltInProfile& profile : builtInProfiles()) {
+        EXPECT_NE(help.find(profile.name), std::string::npos) << profile.name;
+    }
+}
+
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
     for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "fields",
-                                "completion", "manual"}) {
+                                "explain", "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);
@@ -290,9 +313,9 @@ TEST(Options, WrongUsageOfTheServiceAndTheRecorderIsOneClearSentence) {
     EXPECT_EQ(
         wrongUsage({"service", "--relay", "a.pcap"}),
         "pallax: --relay: only -, standard input, can be relayed (see pallax service --help)\n");
-    for (const char* seconds : {"-1", "1000001", "nan", ""}) {
+    for (const char* wait : {"-1", "1000001", "nan", ""}) {
         EXPECT_EQ(
-            wrongUsage({"service", "--relay", "-", "--wait", seconds}),
+            wrongUsage({"service", "--relay", "-", "--wait", wait}),
             "pallax: --wait: must be a number from 0 to 1000000 (see pallax service --help)\n");
     }
     EXPECT_EQ(wrongUsage({"service", "--play", "a.pcap", "--wait", "1"}),

@@ -259,7 +259,8 @@ TEST(DocumentedCommands, TheTourShowsMostOfWhatThereIs) {
             shown.insert(word);
         }
     }
-    for (const char* word : {"decode", "demo", "record", "service", "simulate", "--relay", "csv"}) {
+    for (const char* word :
+         {"decode", "demo", "record", "service", "simulate", "explain", "--relay", "csv"}) {
         EXPECT_TRUE(shown.contains(word)) << word;
     }
 }

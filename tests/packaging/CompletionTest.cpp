@@ -67,6 +67,7 @@ TEST_F(Completion, BashOffersTheChoicesOfAnOption) {
     EXPECT_EQ(inBash("pallax --log-level ''", 2), "0\n1\n2\n3\n4\n5\n6\n7\n");
     EXPECT_EQ(inBash("pallax demo ''", 2), "ifx\ngsm\ncdma\nlte\nutran\n");
     EXPECT_EQ(inBash("pallax fields c", 2), "cdma\n");
+    EXPECT_EQ(inBash("pallax explain --profile f", 3), "field\n");
     EXPECT_EQ(inBash("pallax demo --seed ''", 3), "") << "numbers are not completed";
 }
 
@@ -81,7 +82,7 @@ TEST_F(Completion, BashOffersFilesWhereARecordingOrFileIsTaken) {
 
 TEST_F(Completion, EveryOptionIsInEveryScript) {
     const CommandDescription program = CommandLine().description();
-    ASSERT_EQ(program.commands.size(), 6U);
+    ASSERT_EQ(program.commands.size(), 7U);
     const std::string fish = script("fish");
     for (const CommandDescription& command : program.commands) {
         ASSERT_GE(command.options.size(), 3U);

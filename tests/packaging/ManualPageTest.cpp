@@ -2,6 +2,7 @@
 
 #include "cli/CommandLine.h"
 #include "cli/HelpText.h"
+#include "knowledge/Quality.h"
 #include "tests/doubles/Files.h"
 #include "tests/doubles/Pattern.h"
 #include "tests/doubles/Shell.h"
@@ -29,10 +30,10 @@ CommandDescription program() {
 }
 
 TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
-    EXPECT_EQ(
-        manualPages(program()),
-        (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record", "pallax-service",
-                                  "pallax-demo", "pallax-simulate", "pallax-fields"}));
+    EXPECT_EQ(manualPages(program()),
+              (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record",
+                                        "pallax-service", "pallax-demo", "pallax-simulate",
+                                        "pallax-fields", "pallax-explain"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 
@@ -99,6 +100,13 @@ TEST(ManualPage, TheSettingsPageNamesEverySetting) {
     for (const char* setting :
          {"on-fatal-record", "snapshot-directory", "save-button-marker", "system-log-level"}) {
         EXPECT_NE(page.find(std::string(".BR ") + setting), std::string::npos) << setting;
+    }
+}
+
+TEST(ManualPage, TheSettingsPageNamesEveryMeasure) {
+    const std::string page = plain(contentOf(PALLAX_SOURCE_DIR "/docs/man/pallax.conf.5"));
+    for (const MeasureInfo& each : kMeasures) {
+        EXPECT_NE(page.find(each.name), std::string::npos) << each.name;
     }
 }
 

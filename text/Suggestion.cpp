@@ -1,4 +1,4 @@
-#include "cli/Suggestion.h"
+#include "text/Suggestion.h"
 
 #include <algorithm>
 
@@ -27,7 +27,7 @@ std::size_t editDistance(std::string_view one, std::string_view other) {
 
 std::string nearestName(std::string_view word, const std::vector<std::string>& names) {
     constexpr std::size_t kLettersPerSlip = 3;
-    constexpr std::size_t kLongest = 64; // longer than any name; the table grows with it
+    constexpr std::size_t kLongest = 128; // longer than any name; the table grows with it
     std::string nearest;
     std::size_t least = kLongest;
     for (const std::string& name : names) {

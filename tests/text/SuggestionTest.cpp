@@ -1,4 +1,4 @@
-#include "cli/Suggestion.h"
+#include "text/Suggestion.h"
 
 #include <gtest/gtest.h>
 
