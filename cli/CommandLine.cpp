@@ -2,6 +2,7 @@
 
 #include "cli/Completion.h"
 #include "cli/HelpFormatter.h"
+#include "cli/InspectOptions.h"
 #include "cli/ManualPage.h"
 #include "cli/OptionParts.h"
 #include "cli/SimulateOptions.h"
@@ -90,6 +91,7 @@ CommandLine::CommandLine()
     addSimulate(addCommand("simulate", "Write a simulated modem's packets to a recording"),
                 _simulate);
     addFields(addCommand("fields", "List every field of the display"), _fields);
+    addInfo(addCommand("info", "Tell what recordings hold"), _info);
     addTexts();
 }
 
@@ -167,6 +169,9 @@ ParsedOptions CommandLine::chosen() const {
                           "--rotate-seconds",
                           "record");
     }
+    if (const auto refusal = decodeRefusal(_decode); !refusal.empty()) {
+        return wrongUsage(refusal, "decode");
+    }
     if (!_shell.empty()) {
         return ParseEnd{kExitSuccess, completionScript(description(), _shell)};
     }
@@ -190,6 +195,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("fields")) {
         return _fields;
+    }
+    if (_app->got_subcommand("info")) {
+        return _info;
     }
     return _browse;
 }

@@ -37,6 +37,7 @@ private:
     BrowseOptions _demo;
     DecodeOptions _decode;
     FieldsOptions _fields;
+    InfoOptions _info;
     RecordOptions _record;
     ServiceRequest _service;
     SimulateOptions _simulate;

@@ -4,6 +4,7 @@
 #include "console/ExitStatus.h"
 #include "decoding/DecodeCommand.h"
 #include "decoding/FieldsCommand.h"
+#include "decoding/InfoCommand.h"
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
 #include "telephony/Service.h"
@@ -27,12 +28,15 @@ struct ParseEnd {
 /// `pallax service --status`.
 struct ServiceStatusOptions {};
 
-using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions,
-                                   ServiceStatusOptions, SimulateOptions, FieldsOptions, ParseEnd>;
+using ParsedOptions =
+    std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
+                 SimulateOptions, FieldsOptions, InfoOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);
 void addDecode(CLI::App& app, DecodeOptions& options);
+/// Why the options contradict each other; otherwise empty.
+std::string decodeRefusal(const DecodeOptions& options);
 void addFields(CLI::App& app, FieldsOptions& options);
 void addRecord(CLI::App& app, RecordOptions& options);
 /// The options of all ways of browsing.

@@ -306,10 +306,7 @@ Result<Time, TimeTextError> TimeText::clockIn(const TimeSpan& span, const ZoneRu
         }
     }
     if (!first) {
-        const auto local = [&zone](Time time) {
-            return dateText(dateOf(time + zone(time)))
-                .substr(0, std::string_view("yyyy-mm-dd hh:mm:ss").size());
-        };
+        const auto local = [&zone](Time time) { return localDateText(time, zone(time)); };
         return TimeTextError{formatText("\"%@\" is no time of the recording, which lasts from %@ "
                                         "to %@.",
                                         {_text, local(span.begin), local(end)}),

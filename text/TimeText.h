@@ -44,8 +44,8 @@ public:
     /// or has twice is the first that the clock can have meant.
     Result<Time, TimeTextError> timeIn(const TimeSpan& span, const ZoneRule& zone) const;
 
-    /// Whether `timeIn` needs the end of the recording.
-    bool needsEnd() const { return _kind == Kind::BeforeEnd; }
+    /// Whether `timeIn` depends on the end of the recording.
+    bool needsEnd() const { return _kind == Kind::BeforeEnd || _kind == Kind::Clock; }
 
 private:
     friend class TimeTextParser;

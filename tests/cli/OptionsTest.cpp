@@ -92,6 +92,40 @@ TEST(Options, DecodeWritesTheLastDisplayAsJsonUnlessToldOtherwise) {
     EXPECT_TRUE(told.strict);
 }
 
+TEST(Options, DecodeTakesAPartOfARecording) {
+    const auto part =
+        parsed<DecodeOptions>({"decode", "--from", "+90s", "--to", "14:03", "--select", "lte.*",
+                               "--select", "gsm.?", "--typed", "--join", "a.pcap", "b.pcap"});
+    EXPECT_TRUE(part.window.from && part.window.to);
+    EXPECT_EQ(part.select, (std::vector<std::string>{"lte.*", "gsm.?"}));
+    EXPECT_EQ(part.recordings, (std::vector<std::string>{"a.pcap", "b.pcap"}));
+    EXPECT_TRUE(part.typed);
+    EXPECT_TRUE(part.join);
+    EXPECT_FALSE(part.recordingColumn);
+    const auto at = parsed<DecodeOptions>(
+        {"decode", "--at", "-5m", "--format", "csv", "--recording-column", "a.pcap"});
+    EXPECT_EQ(at.chosenEvery(), Every::End);
+    EXPECT_TRUE(at.chosenWindow().to && !at.chosenWindow().from);
+    EXPECT_TRUE(at.recordingColumn);
+    const auto refused = [](std::vector<std::string> arguments) {
+        arguments.insert(arguments.begin(), {"decode", "a.pcap"});
+        const ParseEnd end = ended(arguments);
+        EXPECT_EQ(end.status, kExitWrongUsage);
+        return end.text;
+    };
+    EXPECT_EQ(refused({"--at", "noon"}),
+              "pallax: --at: \"noon\" is not a time: expected 14:03, 2023-11-14T14:03, +90s, -5m, "
+              "start or end (character 1) (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--at", "end", "--every", "tick"}),
+              "pallax: --every excludes --at (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--at", "end", "--to", "end"}),
+              "pallax: --to excludes --at (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--recording-column"}),
+              "pallax: --recording-column requires --format csv (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--format", "csv", "--typed"}),
+              "pallax: --typed requires --format json (see pallax decode --help)\n");
+}
+
 TEST(Options, DecodeTakesEveryTechnology) {
     for (const char* name : {"ifx", "gsm", "cdma", "lte", "utran"}) {
         EXPECT_EQ(
@@ -118,8 +152,8 @@ TEST(Options, ServiceRelaysStandardInput) {
 
 TEST(Options, ServiceRelaysAfterSoLongAWait) {
     using std::chrono::milliseconds;
-    const auto patience = [](const char* seconds) {
-        return parsed<ServiceOptions>({"service", "--relay", "-", "--wait", seconds}).relayPatience;
+    const auto patience = [](const char* wait) {
+        return parsed<ServiceOptions>({"service", "--relay", "-", "--wait", wait}).relayPatience;
     };
     EXPECT_EQ(patience("0"), milliseconds(0));
     EXPECT_EQ(patience("2.5"), milliseconds(2500));
@@ -225,6 +259,12 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
               "service --help)\n");
 }
 
+TEST(Options, InfoTakesFiles) {
+    const auto info = parsed<InfoOptions>({"info", "a.pcap", "--json", "-"});
+    EXPECT_EQ(info.files, (std::vector<std::string>{"a.pcap", "-"}));
+    EXPECT_TRUE(info.json);
+}
+
 TEST(Options, FieldsAreOfEveryTechnologyUnlessOneIsNamed) {
     const auto plain = parsed<FieldsOptions>({"fields"});
     EXPECT_EQ(plain.technology, nullptr);
@@ -238,7 +278,7 @@ TEST(Options, FieldsAreOfEveryTechnologyUnlessOneIsNamed) {
 
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
     for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "fields",
-                                "completion", "manual"}) {
+                                "info", "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);
@@ -290,9 +330,9 @@ TEST(Options, WrongUsageOfTheServiceAndTheRecorderIsOneClearSentence) {
     EXPECT_EQ(
         wrongUsage({"service", "--relay", "a.pcap"}),
         "pallax: --relay: only -, standard input, can be relayed (see pallax service --help)\n");
-    for (const char* seconds : {"-1", "1000001", "nan", ""}) {
+    for (const char* wait : {"-1", "1000001", "nan", ""}) {
         EXPECT_EQ(
-            wrongUsage({"service", "--relay", "-", "--wait", seconds}),
+            wrongUsage({"service", "--relay", "-", "--wait", wait}),
             "pallax: --wait: must be a number from 0 to 1000000 (see pallax service --help)\n");
     }
     EXPECT_EQ(wrongUsage({"service", "--play", "a.pcap", "--wait", "1"}),

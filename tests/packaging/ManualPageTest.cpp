@@ -29,10 +29,10 @@ CommandDescription program() {
 }
 
 TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
-    EXPECT_EQ(
-        manualPages(program()),
-        (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record", "pallax-service",
-                                  "pallax-demo", "pallax-simulate", "pallax-fields"}));
+    EXPECT_EQ(manualPages(program()),
+              (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record",
+                                        "pallax-service", "pallax-demo", "pallax-simulate",
+                                        "pallax-fields", "pallax-info"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 

@@ -128,7 +128,9 @@ TEST_F(TimeTextTest, WithoutAnEndOnlyTheEndIsNotKnown) {
                              {text}));
         EXPECT_TRUE(TimeText::parse(text)->needsEnd());
     }
+    EXPECT_TRUE(TimeText::parse("20:09")->needsEnd());
     EXPECT_FALSE(TimeText::parse("start")->needsEnd());
+    EXPECT_FALSE(TimeText::parse("2023-11-14T14:03")->needsEnd());
 }
 
 TEST_F(TimeTextTest, WhereTheClockChangesTheFirstTimeIsMeant) {
