@@ -1,8 +1,8 @@
 #include "browsing/ScreenBrowser.h"
 
 #include "browsing/LinkNotes.h"
-#include "browsing/ZoneText.h"
 #include "link/Settings.h"
+#include "platform/ZoneText.h"
 
 #include <chrono>
 #include <csignal>

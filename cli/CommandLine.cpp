@@ -2,6 +2,7 @@
 
 #include "cli/Completion.h"
 #include "cli/HelpFormatter.h"
+#include "cli/InspectOptions.h"
 #include "cli/ManualPage.h"
 #include "cli/OptionParts.h"
 #include "cli/SimulateOptions.h"
@@ -92,6 +93,7 @@ CommandLine::CommandLine()
     addFields(addCommand("fields", "List every field of the display"), _fields);
     addExplain(addCommand("explain", "Explain a channel, a network code, a field or a value"),
                _explain);
+    addInfo(addCommand("info", "Tell what recordings hold"), _info);
     addTexts();
 }
 
@@ -169,6 +171,9 @@ ParsedOptions CommandLine::chosen() const {
                           "--rotate-seconds",
                           "record");
     }
+    if (const auto refusal = decodeRefusal(_decode); !refusal.empty()) {
+        return wrongUsage(refusal, "decode");
+    }
     if (!_shell.empty()) {
         return ParseEnd{kExitSuccess, completionScript(description(), _shell)};
     }
@@ -195,6 +200,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("explain")) {
         return _explain;
+    }
+    if (_app->got_subcommand("info")) {
+        return _info;
     }
     return _browse;
 }

@@ -38,6 +38,7 @@ private:
     DecodeOptions _decode;
     ExplainOptions _explain;
     FieldsOptions _fields;
+    InfoOptions _info;
     RecordOptions _record;
     ServiceRequest _service;
     SimulateOptions _simulate;

@@ -18,6 +18,29 @@ CLI::ValidationError unknownChoice(const std::string& name, const std::string& t
                                           suggestion(text, known));
 }
 
+void addTechnology(CLI::App& app, const std::string& name, const RecordedTechnology*& technology,
+                   const std::string& description) {
+    std::vector<std::pair<std::string, const RecordedTechnology*>> technologies;
+    for (const RecordedTechnology& each : recordedTechnologies()) {
+        technologies.emplace_back(each.commandName, &each);
+    }
+    addChoice(app, name, technology, technologies, description);
+}
+
+CLI::Option* addTime(CLI::App& app, const std::string& name, std::optional<TimeText>& time,
+                     const std::string& description) {
+    const auto take = [name, &time](const std::string& text) {
+        const auto parsed = TimeText::parse(text);
+        if (!parsed) {
+            std::string sentence = parsed.error().sentence;
+            sentence.pop_back(); // the full stop
+            throw CLI::ValidationError(name, sentence);
+        }
+        time = *parsed;
+    };
+    return app.add_option_function<std::string>(name, take, description)->type_name("TIME");
+}
+
 CLI::Option* addSpeed(CLI::App& app, PlayOptions& play) {
     const auto takeSpeed = [&play](const std::string& text) {
         const auto speed = parseSpeed(text);

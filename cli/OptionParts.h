@@ -1,11 +1,14 @@
 #pragma once
 
+#include "host/Recording.h"
 #include "telephony/PacketPlayer.h"
+#include "text/TimeText.h"
 
 #include <CLI/CLI.hpp>
 
 #include <algorithm>
 #include <charconv>
+#include <optional>
 #include <string>
 #include <system_error>
 #include <utility>
@@ -51,6 +54,14 @@ Value numberOf(const char* option, const std::string& text, Value least, Value m
     }
     return number;
 }
+
+/// An option or argument that takes the name of a technology.
+void addTechnology(CLI::App& app, const std::string& name, const RecordedTechnology*& technology,
+                   const std::string& description);
+
+/// An option that takes a time of a recording.
+CLI::Option* addTime(CLI::App& app, const std::string& name, std::optional<TimeText>& time,
+                     const std::string& description);
 
 /// --speed X|max.
 CLI::Option* addSpeed(CLI::App& app, PlayOptions& play);

@@ -25,6 +25,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax service --play drive.pcap     play a recording to viewers
   pallax fields | grep -i rsrp         look up a field
   pallax explain earfcn 1850           what a number, a code or a field means
+  pallax info drive.pcap               what a recording holds
 
 Each command has its own help (pallax decode --help). To open a recording with
 the name of a command, add its folder (pallax ./decode).
@@ -34,25 +35,6 @@ Exit status:
   1   failure, explained in one sentence on standard error
   2   wrong usage
   70  ended by a fatal record (--keep-going drops it instead))";
-
-constexpr const char* kDecodeFooter = R"(Examples:
-  pallax decode drive.pcap
-  pallax decode --every tick drive.pcap | jq .display
-  pallax decode --every packet --format csv --technology lte raw.pcap
-  pallax decode --system-log drive.log drive.pcap
-
-Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
-standard input; a recording may be a named pipe. Displays from a pipe are
-written without delay; several pipes are read in parallel and written one after
-the other. On a terminal, runs of more than two seconds show their progress, and
-characters that could command the terminal are escaped (\x1B, \u202E); CSV in
-files and pipes is as the modem sent it.
-
-Exit status:
-  0   success, or the reader of the output has gone
-  1   failure: cannot read a recording or template, or write the output
-  2   wrong usage
-  70  with --strict: ended by a fatal record)";
 
 constexpr const char* kFieldsFooter = R"(Examples:
   pallax fields lte
@@ -163,19 +145,6 @@ void addView(CLI::App& app, BrowseOptions& options) {
     addLogLevel(app, options.logLevel);
 }
 
-namespace {
-
-void addTechnology(CLI::App& app, const std::string& name, const RecordedTechnology*& technology,
-                   const std::string& description) {
-    std::vector<std::pair<std::string, const RecordedTechnology*>> technologies;
-    for (const RecordedTechnology& each : recordedTechnologies()) {
-        technologies.emplace_back(each.commandName, &each);
-    }
-    addChoice(app, name, technology, technologies, description);
-}
-
-} // namespace
-
 void addBrowse(CLI::App& app, BrowseOptions& options) {
     CLI::Option* recording =
         app.add_option_function<std::string>(
@@ -187,34 +156,6 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
     addView(app, options);
     addPlay(app, options.play, recording);
     app.footer(kFooter);
-}
-
-void addDecode(CLI::App& app, DecodeOptions& options) {
-    addTechnology(app, "--technology", options.technology,
-                  "The technology of the recordings (default: from their link type)");
-    addChoice<std::optional<Every>>(
-        app, "--every", options.every,
-        {{"end", Every::End}, {"tick", Every::Tick}, {"packet", Every::Packet}},
-        "When to write the display (default: end; for csv, tick)");
-    addChoice<DecodeFormat>(app, "--format", options.format,
-                            {{"json", DecodeFormat::Json}, {"csv", DecodeFormat::Csv}},
-                            "JSON, one object per line, or CSV (default: json)");
-    app.add_option("--system-log", options.systemLog, "Write every system-log line to this file")
-        ->type_name("FILE");
-    constexpr unsigned kMostJobs = 1024;
-    app.add_option_function<std::string>(
-           "--jobs",
-           [&options](const std::string& text) {
-               options.jobs = numberOf("--jobs", text, 1U, kMostJobs);
-           },
-           "How many recordings to decode at once (default: one per core)")
-        ->type_name("N");
-    app.add_flag("--strict", options.strict,
-                 "Exit with status 70 at a record that cannot be read instead of skipping it");
-    app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
-        ->required()
-        ->type_name("");
-    app.footer(kDecodeFooter);
 }
 
 void addFields(CLI::App& app, FieldsOptions& options) {

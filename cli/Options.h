@@ -4,6 +4,7 @@
 #include "console/ExitStatus.h"
 #include "decoding/DecodeCommand.h"
 #include "decoding/FieldsCommand.h"
+#include "decoding/InfoCommand.h"
 #include "explaining/ExplainCommand.h"
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
@@ -30,11 +31,13 @@ struct ServiceStatusOptions {};
 
 using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
-                 SimulateOptions, FieldsOptions, ExplainOptions, ParseEnd>;
+                 SimulateOptions, FieldsOptions, ExplainOptions, InfoOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);
 void addDecode(CLI::App& app, DecodeOptions& options);
+/// Why the options contradict each other; otherwise empty.
+std::string decodeRefusal(const DecodeOptions& options);
 void addExplain(CLI::App& app, ExplainOptions& options);
 void addFields(CLI::App& app, FieldsOptions& options);
 void addRecord(CLI::App& app, RecordOptions& options);

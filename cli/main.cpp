@@ -3,6 +3,7 @@
 #include "console/Output.h"
 #include "decoding/Decode.h"
 #include "decoding/FatalRecord.h"
+#include "decoding/InfoCommand.h"
 #include "host/Complaint.h"
 #include "host/StandardDescriptors.h"
 #include "recording/Record.h"
@@ -31,6 +32,7 @@ struct Run {
     ExitStatus operator()(const SimulateOptions& options) const { return runSimulate(options); }
     ExitStatus operator()(const FieldsOptions& options) const { return runFields(options); }
     ExitStatus operator()(const ExplainOptions& options) const { return runExplain(options); }
+    ExitStatus operator()(const InfoOptions& options) const { return runInfo(options); }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);

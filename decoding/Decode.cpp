@@ -5,6 +5,7 @@
 #include "decoding/DecodeCommand.h"
 #include "decoding/DecodeProgress.h"
 #include "decoding/DroppedNotices.h"
+#include "decoding/FieldSelection.h"
 #include "decoding/OrderedWorkers.h"
 #include "decoding/Preconditions.h"
 #include "decoding/RequiredTemplates.h"
@@ -13,6 +14,7 @@
 #include "host/LogSinks.h"
 #include "host/MonotonicClock.h"
 #include "host/RecordingFile.h"
+#include "host/WallClock.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -38,6 +40,10 @@ std::optional<std::string> lossOfInput(const DecodeOptions& options) {
                      : std::nullopt;
 }
 
+std::chrono::seconds localZone(Time time) {
+    return WallClock().zone(time).offset;
+}
+
 /// Calls `use` with the command, connected to this machine.
 template <class Use>
 ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, const Use& use) {
@@ -52,7 +58,7 @@ ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, c
         return Recording::openInput({path, {}, report});
     };
     DecodeCommand command(options, {resources, bundle, notices, technologies()}, open, report,
-                          progress.isShown() ? &progress : nullptr);
+                          progress.isShown() ? &progress : nullptr, localZone);
     return use(command);
 }
 
@@ -159,7 +165,7 @@ ExitStatus decodeAtOnce(const DecodeOptions& options, DecodeProgress& progress, 
 /// pipes may have one writer, which waits until all of them are opened.
 unsigned jobsFor(const DecodeOptions& options) {
     const auto& recordings = options.recordings;
-    if (recordings.size() < 2 ||
+    if (recordings.size() < 2 || options.join ||
         std::find(recordings.begin(), recordings.end(), "-") != recordings.end() ||
         std::count_if(recordings.begin(), recordings.end(), RecordingFile::isStream) == 1) {
         return 1;
@@ -181,6 +187,13 @@ ExitStatus runDecode(const DecodeOptions& options) {
     if (const auto loss = lossOfInput(options)) {
         complain(*loss);
         return kExitFailure;
+    }
+    if (!options.select.empty()) {
+        const RequiredTemplates resources(DirectoryResources::programFolder());
+        if (const auto name = FieldSelection::unknownName(options.select, resources)) {
+            complain(formatText("No field is named \"%@\" (see pallax fields).", {*name}));
+            return kExitWrongUsage;
+        }
     }
     if (!options.systemLog) {
         return decodeAll(options, nullptr);

@@ -1,29 +1,32 @@
 #include "decoding/DecodeCommand.h"
 
 #include "decoding/FatalRecord.h"
+#include "decoding/JoinedRecording.h"
 #include "decoding/Preconditions.h"
+#include "decoding/RecordingSpan.h"
+#include "decoding/SelectedOutput.h"
 #include "decoding/StampSentence.h"
+#include "text/Format.h"
 
 #include <utility>
 
 namespace pallax {
 
-namespace {
-
-std::unique_ptr<DisplayOutput> displayOutput(const DecodeOptions& options, Output& output,
-                                             bool withHeader) {
-    if (options.format == DecodeFormat::Csv) {
-        return std::make_unique<CsvOutput>(output, withHeader);
+std::unique_ptr<DisplayOutput> DecodeCommand::displayOutput(Output& output, bool withHeader) const {
+    if (_options.format == DecodeFormat::Csv) {
+        const auto names =
+            _options.recordingColumn ? CsvOutput::Names::Column : CsvOutput::Names::Left;
+        return std::make_unique<CsvOutput>(output, withHeader, names);
     }
-    return std::make_unique<JsonOutput>(output, options.chosenEvery());
+    const auto numbers = _options.typed ? JsonNumbers::Typed : JsonNumbers::AsTexts;
+    return std::make_unique<JsonOutput>(output, _options.chosenEvery(), numbers);
 }
 
-} // namespace
-
 ExitStatus DecodeCommand::run(Output& output) {
-    const auto displays = displayOutput(_options, output, true);
+    const auto displays = displayOutput(output, true);
     ExitStatus status = kExitSuccess;
-    for (std::size_t place = 0; place < _options.recordings.size(); ++place) {
+    const std::size_t count = _options.join ? 1 : _options.recordings.size();
+    for (std::size_t place = 0; place < count; ++place) {
         const ExitStatus result = decodeNext(place, {output, *displays});
         status = result == kExitSuccess ? status : result;
         output.flush(); // the next recording may have to be waited for
@@ -35,7 +38,7 @@ ExitStatus DecodeCommand::run(Output& output) {
 }
 
 ExitStatus DecodeCommand::runOne(std::size_t recording, Output& output) {
-    const auto displays = displayOutput(_options, output, recording == 0);
+    const auto displays = displayOutput(output, recording == 0);
     const ExitStatus status = decodeNext(recording, {output, *displays});
     output.flush();
     return status;
@@ -43,59 +46,81 @@ ExitStatus DecodeCommand::runOne(std::size_t recording, Output& output) {
 
 ExitStatus DecodeCommand::decodeNext(std::size_t place, const Destination& destination) {
     _place = place;
-    const ExitStatus status = decodePath(_options.recordings.at(place), destination);
-    if (_watcher != nullptr) {
-        _watcher->recordingDone(place);
+    const ExitStatus status = decodeOpened(openWhole(place), destination);
+    const std::size_t end = _options.join ? _options.recordings.size() : place + 1;
+    for (std::size_t done = place; _watcher != nullptr && done < end; ++done) {
+        _watcher->recordingDone(done);
     }
     return status;
 }
 
-ExitStatus DecodeCommand::decodePath(const std::string& path, const Destination& destination) {
-    const Recording::OpenResult recording = _open(path);
-    if (!recording) {
-        _report(recording.error().sentence);
-        return kExitFailure;
-    }
-    return decode(**recording, destination);
+Recording::OpenResult DecodeCommand::openWhole(std::size_t place) const {
+    return _options.join ? JoinedRecording::open(_options.recordings, _open)
+                         : _open(_options.recordings.at(place));
+}
+
+ExitStatus DecodeCommand::decodeOpened(const Recording::OpenResult& recording,
+                                       const Destination& destination) {
+    return recording ? decode(**recording, destination) : failed(recording.error().sentence);
 }
 
 ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destination) {
     const RecordedTechnology* technology =
         _options.technology != nullptr ? _options.technology : recording.technology();
     if (technology == nullptr) {
-        _report(recording.foreignLinkType().sentence);
-        return kExitFailure;
+        return failed(recording.foreignLinkType().sentence);
     }
-    RecordingDecoder decoder(_environment, technology->identifier, _options.chosenEvery(),
-                             destination.displays);
+    destination.displays.nameRecording(recording.name());
+    if (_options.select.empty()) {
+        return decodeWith(recording, *technology, destination);
+    }
+    SelectedOutput selected(
+        destination.displays,
+        FieldSelection(_options.select,
+                       FieldRegistry(gatherReference(*technology, _environment.resources))));
+    return decodeWith(recording, *technology, {destination.output, selected});
+}
+
+ExitStatus DecodeCommand::decodeWith(Recording& recording, const RecordedTechnology& technology,
+                                     const Destination& destination) {
+    DecodeWindow window(_options.chosenWindow());
+    WindowedOutput displays(destination.displays, window, _options.chosenEvery());
+    RecordingDecoder decoder(_environment, technology.identifier, _options.chosenEvery(), displays);
     if (!decoder.hasGenerator()) {
-        _report(noGeneratorSentence(recording.name(), technology->identifier));
-        return kExitFailure;
+        return failed(noGeneratorSentence(recording.name(), technology.identifier));
     }
-    return decodePackets(recording, decoder, destination.output);
+    if (const auto span = spanBefore(recording)) {
+        if (const auto sentence = window.open(*span, _zone)) {
+            return failed(recording.name() + ": " + *sentence);
+        }
+    }
+    return decodePackets(recording, decoder, window, destination.output);
+}
+
+std::optional<TimeSpan> DecodeCommand::spanBefore(const Recording& recording) const {
+    if (!_options.chosenWindow().needEnd() || recording.isStream()) {
+        return std::nullopt;
+    }
+    const auto again = openWhole(_place);
+    return again ? spanOf(**again) : std::nullopt;
 }
 
 ExitStatus DecodeCommand::decodePackets(Recording& recording, RecordingDecoder& decoder,
-                                        Output& output) {
+                                        DecodeWindow& window, Output& output) {
     const bool isWaitedFor = !recording.position();
-    bool toldOutOfRange = false;
+    _toldOutOfRange = false;
     while (const auto packet = recording.next()) {
-        const auto reason = decoder.add(*packet);
-        const auto tell = [&](const StampRemark& remark) {
-            _report(stampSentence(recording.name(), decoder.packets(), remark));
-        };
-        if (packet->isOutOfRange && !std::exchange(toldOutOfRange, true)) {
-            tell({StampRemark::Kind::OutOfRange, {}});
-        }
-        if (decoder.step()) {
-            tell(*decoder.step());
-        }
-        if (reason) {
-            _report(recording.name() + ": " +
-                    fatalRecordSentence(decoder.packets(), packet->data, *reason));
-            if (_options.strict) {
-                return kExitFatalRecord;
+        if (!window.isOpen()) {
+            if (const auto sentence = window.open({packet->time, std::nullopt}, _zone)) {
+                return failed(recording.name() + ": " + *sentence);
             }
+        }
+        if (window.isOverBefore(packet->time)) {
+            break;
+        }
+        const auto reason = decoder.add(*packet);
+        if (tellPacket(recording, decoder, *packet, reason)) {
+            return kExitFatalRecord;
         }
         if (isWaitedFor) {
             output.flush(); // a completed display must not wait for the next packet
@@ -104,12 +129,31 @@ ExitStatus DecodeCommand::decodePackets(Recording& recording, RecordingDecoder& 
             _watcher->packetDone(_place, recording, decoder.packets());
         }
     }
-    decoder.finish();
-    if (recording.error()) {
-        _report(recording.error()->sentence);
-        return kExitFailure;
+    if (_options.chosenEvery() == Every::End && decoder.packets() > 0 && !window.hasBegun()) {
+        return failed(recording.name() +
+                      ": every packet is later than the time that is asked for.");
     }
-    return kExitSuccess;
+    decoder.finish();
+    return recording.error() ? failed(recording.error()->sentence) : kExitSuccess;
+}
+
+bool DecodeCommand::tellPacket(const Recording& recording, const RecordingDecoder& decoder,
+                               const RecordedPacket& packet,
+                               const std::optional<std::string>& reason) {
+    const auto tell = [&](const StampRemark& remark) {
+        _report(stampSentence(recording.name(), decoder.packets(), remark));
+    };
+    if (packet.isOutOfRange && !std::exchange(_toldOutOfRange, true)) {
+        tell({StampRemark::Kind::OutOfRange, {}});
+    }
+    if (decoder.step()) {
+        tell(*decoder.step());
+    }
+    if (reason) {
+        _report(recording.name() + ": " +
+                fatalRecordSentence(decoder.packets(), packet.data, *reason));
+    }
+    return reason && _options.strict;
 }
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "console/ExitStatus.h"
+#include "decoding/DecodeWindow.h"
 #include "decoding/RecordingDecoder.h"
 #include "host/Recording.h"
 
@@ -26,9 +27,19 @@ struct DecodeOptions {
     bool strict = false;
     /// How many recordings are decoded at once; if missing, one per core.
     std::optional<unsigned> jobs;
+    DecodeWindow::Texts window = {};      ///< of the displays to write
+    std::optional<TimeText> at = {};      ///< the only display to write, in place of these
+    std::vector<std::string> select = {}; ///< names of fields; if empty, all
+    bool typed = false;                   ///< JSON: numbers as objects
+    bool recordingColumn = false;         ///< CSV
+    bool join = false;                    ///< the recordings are one
 
+    DecodeWindow::Texts chosenWindow() const {
+        return at ? DecodeWindow::Texts{std::nullopt, at} : window;
+    }
     Every chosenEvery() const {
-        return every.value_or(format == DecodeFormat::Csv ? Every::Tick : Every::End);
+        return at ? Every::End
+                  : every.value_or(format == DecodeFormat::Csv ? Every::Tick : Every::End);
     }
 };
 
@@ -45,7 +56,7 @@ public:
 };
 
 /// `pallax decode`: recordings to JSON or CSV, in the order of the command line, each with its own
-/// generator and state. A recording that cannot be read does not stop the others.
+/// generator and state, or all as one. A recording that cannot be read does not stop the others.
 class DecodeCommand {
 public:
     using Open = std::function<Recording::OpenResult(const std::string& path)>;
@@ -54,9 +65,9 @@ public:
 
     /// The watcher, if any, must outlive the command.
     DecodeCommand(const DecodeOptions& options, const DecoderEnvironment& environment, Open open,
-                  Report report, DecodeWatcher* watcher = nullptr)
+                  Report report, DecodeWatcher* watcher = nullptr, ZoneRule zone = utc)
         : _options(options), _environment(environment), _open(std::move(open)),
-          _report(std::move(report)), _watcher(watcher) {}
+          _report(std::move(report)), _watcher(watcher), _zone(std::move(zone)) {}
 
     /// Writes to `output`. Exceptions of `output` and TemplateFailure propagate. Displays of a pipe
     /// are written without delay, those of a file in blocks.
@@ -71,17 +82,35 @@ private:
         DisplayOutput& displays; // which writes to it
     };
 
+    static std::chrono::seconds utc(Time /*time*/) { return {}; }
+
+    std::unique_ptr<DisplayOutput> displayOutput(Output& output, bool withHeader) const;
     ExitStatus decodeNext(std::size_t place, const Destination& destination);
-    ExitStatus decodePath(const std::string& path, const Destination& destination);
+    ExitStatus decodeOpened(const Recording::OpenResult& recording, const Destination& destination);
     ExitStatus decode(Recording& recording, const Destination& destination);
-    ExitStatus decodePackets(Recording& recording, RecordingDecoder& decoder, Output& output);
+    ExitStatus decodeWith(Recording& recording, const RecordedTechnology& technology,
+                          const Destination& destination);
+    /// The span of a recording whose end matters; nothing if it is not needed or not to be known.
+    std::optional<TimeSpan> spanBefore(const Recording& recording) const;
+    Recording::OpenResult openWhole(std::size_t place) const;
+    ExitStatus decodePackets(Recording& recording, RecordingDecoder& decoder, DecodeWindow& window,
+                             Output& output);
+    /// Reports what is odd about the latest packet; true if it ends the program.
+    bool tellPacket(const Recording& recording, const RecordingDecoder& decoder,
+                    const RecordedPacket& packet, const std::optional<std::string>& reason);
+    ExitStatus failed(std::string_view sentence) const {
+        _report(sentence);
+        return kExitFailure;
+    }
 
     DecodeOptions _options;
     DecoderEnvironment _environment;
     Open _open;
     Report _report;
     DecodeWatcher* _watcher;
+    ZoneRule _zone;
     std::size_t _place = 0; // of the current recording
+    bool _toldOutOfRange = false;
 };
 
 } // namespace pallax

@@ -92,18 +92,41 @@ void appendReal(std::string& out, double number) {
     }
 }
 
-void appendValue(std::string& out, const PropertyList& object, int depth);
+void appendTyped(std::string& out, const DisplayNumber& number) {
+    out += "{\"number\":";
+    const std::size_t start = out.size();
+    appendBareNumber(out, number);
+    out += out.size() == start ? "null,\"unit\":" : ",\"unit\":";
+    if (number.unit().empty()) {
+        out += "null";
+    } else {
+        appendJsonString(out, number.unit());
+    }
+    out += ",\"text\":";
+    appendJsonString(out, number.text());
+    out += '}';
+}
 
-void appendArray(std::string& out, const Array& elements, int depth) {
+/// Where a value stands, and how numbers are written.
+struct Writing {
+    JsonNumbers numbers;
+    int depth = 0;
+
+    Writing inside() const { return {numbers, depth + 1}; }
+};
+
+void appendValue(std::string& out, const PropertyList& object, const Writing& writing);
+
+void appendArray(std::string& out, const Array& elements, const Writing& writing) {
     out += '[';
     for (const PropertyList& element : elements) {
         out += &element == elements.data() ? "" : ",";
-        appendValue(out, element, depth);
+        appendValue(out, element, writing);
     }
     out += ']';
 }
 
-void appendDictionary(std::string& out, const Dictionary& entries, int depth) {
+void appendDictionary(std::string& out, const Dictionary& entries, const Writing& writing) {
     out += '{';
     bool first = true;
     for (const Dictionary::Entry& entry : entries) {
@@ -114,19 +137,23 @@ void appendDictionary(std::string& out, const Dictionary& entries, int depth) {
         first = false;
         appendJsonString(out, entry.key.view());
         out += ':';
-        appendValue(out, entry.value, depth);
+        appendValue(out, entry.value, writing);
     }
     out += '}';
 }
 
-void appendValue(std::string& out, const PropertyList& object, int depth) {
+void appendValue(std::string& out, const PropertyList& object, const Writing& writing) {
     using Type = PropertyList::Type;
     switch (object.type()) {
     case Type::kNull:
         out += "null";
         return;
     case Type::kString:
-        appendStringValue(out, object);
+        if (writing.numbers == JsonNumbers::Typed && object.displayNumber() != nullptr) {
+            appendTyped(out, *object.displayNumber());
+        } else {
+            appendStringValue(out, object);
+        }
         return;
     case Type::kInteger:
         if (const auto large = object.largeInteger()) {
@@ -153,19 +180,37 @@ void appendValue(std::string& out, const PropertyList& object, int depth) {
     case Type::kDictionary:
         break;
     }
-    if (depth >= kDeepestJson) {
+    if (writing.depth >= kDeepestJson) {
         out += "null";
     } else if (const DictionaryRef dictionary = object.dictionary()) {
-        appendDictionary(out, *dictionary, depth + 1);
+        appendDictionary(out, *dictionary, writing.inside());
     } else {
-        appendArray(out, *object.array(), depth + 1);
+        appendArray(out, *object.array(), writing.inside());
     }
 }
 
 } // namespace
 
-void appendJson(std::string& out, const PropertyList& object) {
-    appendValue(out, object, 0);
+void appendJson(std::string& out, const PropertyList& object, JsonNumbers numbers) {
+    appendValue(out, object, {numbers});
+}
+
+void appendBareNumber(std::string& out, const DisplayNumber& number) {
+    const NumberConversion& shown = number.format().conversion();
+    NumberConversion bare;
+    bare.wide = shown.wide;
+    bare.conversion = shown.conversion;
+    if (number.isReal()) {
+        bare.precision = shown.precision;
+        if (std::isfinite(number.real())) {
+            appendConverted(out, bare, number.real());
+        }
+        return;
+    }
+    if (bare.conversion == 'x' || bare.conversion == 'X') {
+        bare.conversion = 'u';
+    }
+    appendConverted(out, bare, number.integer());
 }
 
 void appendJsonString(std::string& out, std::string_view text) {

@@ -12,10 +12,20 @@ namespace pallax {
 /// Containers nested deeper become null.
 inline constexpr int kDeepestJson = 512;
 
-/// A string (including a display number) becomes its text, data base64, a date its ISO 8601 text, a
-/// real the shortest number that reads back the same (null if not finite). Keys keep their order;
-/// entries with a key that is not a string are omitted.
-void appendJson(std::string& out, const PropertyList& object);
+enum class JsonNumbers {
+    AsTexts,
+    Typed, ///< {"number":-94.75,"unit":"dBm","text":"-94.75 dBm"}; without a unit it is null
+};
+
+/// A string becomes its text, as does a display number unless it is to be typed, data base64, a
+/// date its ISO 8601 text, a real the shortest number that reads back the same (null if not
+/// finite). Keys keep their order; entries with a key that is not a string are omitted.
+void appendJson(std::string& out, const PropertyList& object,
+                JsonNumbers numbers = JsonNumbers::AsTexts);
+
+/// The number as in its text, without padding and plus sign; a hexadecimal one in decimal. Nothing
+/// if it is not finite.
+void appendBareNumber(std::string& out, const DisplayNumber& number);
 
 /// One quoted JSON string. Each invalid UTF-8 byte becomes U+FFFD.
 void appendJsonString(std::string& out, std::string_view text);

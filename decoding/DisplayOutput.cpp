@@ -1,6 +1,5 @@
 #include "decoding/DisplayOutput.h"
 
-#include "decoding/DisplayJson.h"
 #include "text/Printable.h"
 
 #include <cmath>
@@ -26,25 +25,6 @@ void appendCell(std::string& out, std::string_view text) {
     }
     quoted += '"';
     appendValidUtf8(out, quoted);
-}
-
-/// The number as in its text, without padding and plus sign; a hexadecimal one in decimal.
-void appendBareNumber(std::string& out, const DisplayNumber& number) {
-    const NumberConversion& shown = number.format().conversion();
-    NumberConversion bare;
-    bare.wide = shown.wide;
-    bare.conversion = shown.conversion;
-    if (number.isReal()) {
-        bare.precision = shown.precision;
-        if (std::isfinite(number.real())) {
-            appendConverted(out, bare, number.real());
-        }
-        return;
-    }
-    if (bare.conversion == 'x' || bare.conversion == 'X') {
-        bare.conversion = 'u';
-    }
-    appendConverted(out, bare, number.integer());
 }
 
 std::string textOf(const PropertyList& value) {
@@ -80,28 +60,38 @@ std::string cellsOf(const PropertyList& value) {
 void JsonOutput::show(const DisplayMoment& moment, const PropertyList& display) {
     std::string& text = _output.text();
     if (_every == Every::End) {
-        appendJson(text, display);
+        appendJson(text, display, _numbers);
     } else {
         text += _every == Every::Tick ? "{\"tick\":" : "{\"packet\":";
         text += std::to_string(moment.number);
         text += ",\"time\":\"";
         text += isoTimeText(moment.time);
         text += "\",\"display\":";
-        appendJson(text, display);
+        appendJson(text, display, _numbers);
         text += '}';
     }
     text += '\n';
     _output.lineDone();
 }
 
-CsvOutput::CsvOutput(Output& output, bool withHeader) : _output(output) {
+CsvOutput::CsvOutput(Output& output, bool withHeader, Names names)
+    : _output(output), _names(names) {
     if (withHeader) {
-        _output.text() += kHeader;
+        _output.text().append(names == Names::Column ? "recording," : "").append(kHeader);
+    }
+}
+
+void CsvOutput::nameRecording(std::string_view name) {
+    if (_names == Names::Column) {
+        _name.clear();
+        appendCell(_name, name);
+        _name += ',';
     }
 }
 
 void CsvOutput::show(const DisplayMoment& moment, const PropertyList& display) {
-    _time = isoTimeText(moment.time);
+    _start = _name;
+    _start.append(isoTimeText(moment.time)).append(",");
     _difference.compare(display, *this);
 }
 
@@ -120,8 +110,7 @@ void CsvOutput::removed(std::string_view path, DisplayDifference::Leaf& /*leaf*/
 
 void CsvOutput::writeRow(std::string_view path, std::string_view cells) {
     std::string& text = _output.text();
-    text += _time;
-    text += ',';
+    text += _start;
     appendCell(text, path);
     text += ',';
     text += cells;

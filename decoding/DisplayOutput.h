@@ -2,6 +2,7 @@
 
 #include "console/Output.h"
 #include "decoding/DisplayDifference.h"
+#include "decoding/DisplayJson.h"
 #include "plist/PropertyList.h"
 #include "text/Date.h"
 
@@ -24,6 +25,8 @@ struct DisplayMoment {
 class DisplayOutput {
 public:
     virtual ~DisplayOutput() = default;
+    /// Called before `beginRecording` where the output may name its recordings.
+    virtual void nameRecording(std::string_view /*name*/) {}
     virtual void beginRecording() = 0;
     /// `display` is null if there is none yet.
     virtual void show(const DisplayMoment& moment, const PropertyList& display) = 0;
@@ -34,7 +37,8 @@ public:
 /// packets.
 class JsonOutput final : public DisplayOutput {
 public:
-    JsonOutput(Output& output, Every every) : _output(output), _every(every) {}
+    JsonOutput(Output& output, Every every, JsonNumbers numbers = JsonNumbers::AsTexts)
+        : _output(output), _every(every), _numbers(numbers) {}
 
     void beginRecording() override {}
     void show(const DisplayMoment& moment, const PropertyList& display) override;
@@ -42,18 +46,23 @@ public:
 private:
     Output& _output;
     Every _every;
+    JsonNumbers _numbers;
 };
 
 /// A table "time,path,value,number,unit" (RFC 4180, lines end in LF; the header once), with a row
 /// for each path of the display tree whose value differs from the recording's previous display. The
 /// rows of one display are in display order, followed by those of removed paths, by path, with
 /// empty value, number and unit. A value that is not a string is written as in JSON. `number` is
-/// the decimal number of a numeric value, and empty for any other (and if not finite).
+/// the decimal number of a numeric value, and empty for any other (and if not finite). The name of
+/// the recording is a column before the others on request.
 class CsvOutput final : public DisplayOutput, private DisplayDifference::Listener {
 public:
-    /// Without its header the table continues another one.
-    explicit CsvOutput(Output& output, bool withHeader = true);
+    enum class Names { Left, Column };
 
+    /// Without its header the table continues another one.
+    explicit CsvOutput(Output& output, bool withHeader = true, Names names = Names::Left);
+
+    void nameRecording(std::string_view name) override;
     void beginRecording() override { _difference.clear(); }
     void show(const DisplayMoment& moment, const PropertyList& display) override;
 
@@ -65,7 +74,9 @@ private:
 
     Output& _output;
     DisplayDifference _difference;
-    std::string _time;
+    Names _names;
+    std::string _start; ///< the cells before the path
+    std::string _name;  ///< a cell with its comma, or empty
 };
 
 } // namespace pallax

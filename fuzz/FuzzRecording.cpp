@@ -1,5 +1,5 @@
-// A recording of any bytes, pcap or pcapng: it is opened or refused with one sentence, every packet
-// is in readable memory, and a recording that ends early says so.
+// A recording of any bytes, pcap or pcapng, perhaps compressed: it is opened or refused with one
+// sentence, every packet is in readable memory, and a recording that ends early says so.
 
 #include "host/Recording.h"
 

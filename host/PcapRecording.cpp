@@ -1,5 +1,6 @@
 // The reader of recordings, on libpcap.
 
+#include "host/Decompression.h"
 #include "host/Recording.h"
 #include "host/RecordingFile.h"
 #include "text/Format.h"
@@ -30,17 +31,29 @@ RecordingError errorOf(Kind kind, const std::string& name, std::string_view what
 /// pcapng as 64 bits in its own units.
 enum class StampForm { Pcap, PcapNg };
 
+/// A file that is open for reading, and its content.
+struct OpenedFile {
+    std::FILE* content = nullptr; ///< owned by the capture once it reads it
+    bool isStream = false;
+    std::unique_ptr<DecompressedFile> compressed = nullptr; ///< null if the file is plain
+
+    DecompressedFile::Ending ending() const {
+        return compressed ? compressed->ending() : DecompressedFile::Ending::Whole;
+    }
+};
+
 class PcapRecording final : public Recording {
 public:
-    PcapRecording(std::string name, pcap_t* capture, StampForm form, bool isStream)
-        : _name(std::move(name)), _capture(capture), _linkType(pcap_datalink(capture)), _form(form),
-          _isStream(isStream) {}
+    PcapRecording(std::string name, pcap_t* capture, StampForm form, OpenedFile file)
+        : _name(std::move(name)), _file(std::move(file)), _capture(capture),
+          _linkType(pcap_datalink(capture)), _form(form) {}
     ~PcapRecording() override { pcap_close(_capture); }
     PcapRecording(const PcapRecording&) = delete;
     PcapRecording& operator=(const PcapRecording&) = delete;
 
     const std::string& name() const override { return _name; }
-    bool isStream() const override { return _isStream; }
+    bool isStream() const override { return _file.isStream; }
+    std::string format() const override;
     int linkType() const override { return _linkType; }
     const RecordedTechnology* technology() const override {
         return technologyOfLinkType(_linkType);
@@ -51,11 +64,13 @@ public:
     const std::optional<RecordingError>& error() const override { return _error; }
 
 private:
+    std::optional<RecordingError> errorAtEnd(int status) const;
+
     std::string _name;
+    OpenedFile _file;
     pcap_t* _capture;
     int _linkType;
     StampForm _form;
-    bool _isStream;
     std::optional<RecordingError> _error;
     bool _ended = false;
 };
@@ -102,63 +117,107 @@ std::optional<RecordedPacket> PcapRecording::next() {
         const Stamp stamp = stampOf(header->ts, _form);
         return RecordedPacket{stamp.time, Bytes(data, header->caplen), stamp.isOutOfRange};
     }
-    if (status == PCAP_ERROR) {
-        // A read reached the end of the file within a packet or header.
-        const bool cut = std::feof(pcap_file(_capture)) != 0;
-        _error = cut ? errorOf(Kind::CutShort, _name, "ends in the middle of a packet")
-                     : errorOf(Kind::Unreadable, _name,
-                               formatText("cannot be read further: %@", {pcap_geterr(_capture)}));
+    if (!_ended) {
+        _error = errorAtEnd(status);
     }
     _ended = true;
     return std::nullopt;
 }
 
+/// Why no packet follows, after a status other than that of a packet.
+std::optional<RecordingError> PcapRecording::errorAtEnd(int status) const {
+    const auto unreadable = [this](std::string_view reason) {
+        return errorOf(Kind::Unreadable, _name, formatText("cannot be read further: %@", {reason}));
+    };
+    // What the capture's library sees of a damaged file is that it ends.
+    if (_file.ending() == DecompressedFile::Ending::Unreadable) {
+        return unreadable(_file.compressed->reason());
+    }
+    // A read reached the end of the file within a packet or header.
+    const bool cut = status == PCAP_ERROR && std::feof(pcap_file(_capture)) != 0;
+    if (cut || _file.ending() == DecompressedFile::Ending::Cut) {
+        return errorOf(Kind::CutShort, _name, "ends in the middle of a packet");
+    }
+    return status == PCAP_ERROR ? std::optional(unreadable(pcap_geterr(_capture))) : std::nullopt;
+}
+
+std::string PcapRecording::format() const {
+    const std::string plain = _form == StampForm::PcapNg ? "pcapng" : "pcap";
+    return _file.compressed ? formatText("%@ of %@", {_file.compressed->form(), plain}) : plain;
+}
+
 std::optional<std::uint64_t> PcapRecording::position() const {
+    if (_file.compressed) {
+        return _file.compressed->position();
+    }
     const off_t position = ::ftello(pcap_file(_capture));
     return position >= 0 ? std::optional(static_cast<std::uint64_t>(position)) : std::nullopt;
 }
 
-struct OpenedFile {
-    std::FILE* file;
+struct OpenedInput {
+    Descriptor descriptor;
     bool isStream;
 };
 
-/// Opens the file for reading; the error says why it cannot.
-Result<OpenedFile, RecordingError> openFile(const Recording::Input& input,
-                                            const std::string& name) {
-    const auto failed = [&name](std::string_view reason) {
-        return errorOf(Kind::CannotOpen, name, formatText("cannot be opened: %@", {reason}));
-    };
-    if (input.path == "-") {
-        struct stat status {};
-        if (::fstat(STDIN_FILENO, &status) != 0) {
-            return failed(std::strerror(errno));
-        }
-        return S_ISDIR(status.st_mode)
-                   ? Result<OpenedFile, RecordingError>(failed("it is a folder"))
-                   : OpenedFile{stdin, true};
+RecordingError cannotOpen(const std::string& name, std::string_view reason) {
+    return errorOf(Kind::CannotOpen, name, formatText("cannot be opened: %@", {reason}));
+}
+
+Result<OpenedInput, RecordingError> openStandardInput(const std::string& name) {
+    struct stat status {};
+    Descriptor copy(::fcntl(STDIN_FILENO, F_DUPFD_CLOEXEC, 0));
+    if (!copy || ::fstat(copy.number(), &status) != 0) {
+        return cannotOpen(name, std::strerror(errno));
     }
-    const auto opened = RecordingFile::open(input.path, input.waiting);
+    if (S_ISDIR(status.st_mode)) {
+        return cannotOpen(name, "it is a folder");
+    }
+    return OpenedInput{std::move(copy), true};
+}
+
+Result<OpenedInput, RecordingError> openFile(const Recording::Input& input,
+                                             const std::string& name) {
+    if (input.path == "-") {
+        return openStandardInput(name);
+    }
+    auto opened = RecordingFile::open(input.path, input.waiting);
     if (!opened) {
         return opened.error();
     }
-    const int number = ::fcntl(opened->descriptor.number(), F_DUPFD_CLOEXEC, 0);
-    std::FILE* file = number >= 0 ? ::fdopen(number, "rb") : nullptr;
-    if (file == nullptr) {
-        const RecordingError error = failed(std::strerror(errno));
-        if (number >= 0) {
-            (void)::close(number);
-        }
-        return error;
-    }
-    return OpenedFile{file, opened->readOnce};
+    RecordingFile file = std::move(opened).value();
+    return OpenedInput{std::move(file.descriptor), file.readOnce};
 }
 
-RecordingError noCapture(std::FILE* file, const std::string& name, std::string_view reason) {
-    if (std::feof(file) != 0) {
+/// The content of a file whose first byte has been read; null, with errno, if it cannot be read.
+OpenedFile contentOf(OpenedInput input, std::uint8_t first) {
+    OpenedFile file{nullptr, input.isStream};
+    if (mayBeCompressed(first)) {
+        file.compressed = std::make_unique<DecompressedFile>(std::move(input.descriptor), first);
+        file.content = file.compressed->openContent();
+        return file;
+    }
+    const int number = ::fcntl(input.descriptor.number(), F_DUPFD_CLOEXEC, 0);
+    file.content = number >= 0 ? ::fdopen(number, "rb") : nullptr;
+    if (file.content != nullptr) {
+        (void)std::ungetc(first, file.content);
+    } else if (number >= 0) {
+        (void)::close(number);
+    }
+    return file;
+}
+
+/// Why a file is not a recording; `reason` is that of the capture's library.
+RecordingError noCapture(const OpenedFile& file, const std::string& name, std::string_view reason) {
+    using Ending = DecompressedFile::Ending;
+    if (file.ending() == Ending::Unreadable) {
+        return errorOf(Kind::Unreadable, name,
+                       formatText("cannot be read: %@", {file.compressed->reason()}));
+    }
+    const bool isForeign = file.ending() == Ending::NotCompressed;
+    if (!isForeign && std::feof(file.content) != 0) {
         return errorOf(Kind::NoCapture, name, "is not a recording: it ends within its header");
     }
-    if (reason.find("unknown file format") != std::string_view::npos) {
+    if (isForeign || reason.find("unknown file format") != std::string_view::npos) {
         return errorOf(Kind::NoCapture, name, "is not a recording: it is neither pcap nor pcapng");
     }
     return errorOf(Kind::Unreadable, name, formatText("cannot be read: %@", {reason}));
@@ -169,35 +228,43 @@ RecordingError noCapture(std::FILE* file, const std::string& name, std::string_v
 Recording::OpenResult Recording::openInput(const Input& input) {
     const std::string path = input.path == "-" ? "standard input" : input.path;
     const std::string& name = input.name.empty() ? path : input.name;
-    const auto opened = openFile(input, name);
+    auto opened = openFile(input, name);
     if (!opened) {
         return opened.error();
     }
-    std::FILE* file = opened->file;
-    const auto failed = [file](RecordingError error) {
-        if (file != stdin) {
-            (void)std::fclose(file);
-        }
+    OpenedInput source = std::move(opened).value();
+    const RecordingError empty = errorOf(Kind::Empty, name, "is empty");
+    std::uint8_t first = 0;
+    const ssize_t size = ::read(source.descriptor.number(), &first, sizeof(first));
+    if (size <= 0) {
+        return size == 0 ? empty
+                         : errorOf(Kind::CannotOpen, name,
+                                   formatText("cannot be read: %@", {std::strerror(errno)}));
+    }
+    OpenedFile file = contentOf(std::move(source), first);
+    if (file.content == nullptr) {
+        return cannotOpen(name, std::strerror(errno));
+    }
+    const auto failed = [&file](const RecordingError& error) {
+        (void)std::fclose(file.content);
         return error;
     };
-    const int first = std::fgetc(file);
-    if (first == EOF) {
-        return failed(std::ferror(file) != 0
-                          ? errorOf(Kind::CannotOpen, name,
-                                    formatText("cannot be read: %@", {std::strerror(errno)}))
-                          : errorOf(Kind::Empty, name, "is empty"));
+    const int firstOfContent = std::fgetc(file.content);
+    if (firstOfContent == EOF) {
+        const bool isEmpty = file.ending() == DecompressedFile::Ending::Whole;
+        return failed(isEmpty ? empty : noCapture(file, name, ""));
     }
-    (void)std::ungetc(first, file);
+    (void)std::ungetc(firstOfContent, file.content);
     std::array<char, PCAP_ERRBUF_SIZE> reason{};
-    pcap_t* capture =
-        pcap_fopen_offline_with_tstamp_precision(file, PCAP_TSTAMP_PRECISION_NANO, reason.data());
+    pcap_t* capture = pcap_fopen_offline_with_tstamp_precision(
+        file.content, PCAP_TSTAMP_PRECISION_NANO, reason.data());
     if (capture == nullptr) {
         return failed(noCapture(file, name, reason.data()));
     }
     constexpr int kFirstOfPcapNg = 0x0A; // of its first block's type, in either byte order
-    const StampForm form = first == kFirstOfPcapNg ? StampForm::PcapNg : StampForm::Pcap;
+    const StampForm form = firstOfContent == kFirstOfPcapNg ? StampForm::PcapNg : StampForm::Pcap;
     return std::unique_ptr<Recording>(
-        std::make_unique<PcapRecording>(name, capture, form, opened->isStream));
+        std::make_unique<PcapRecording>(name, capture, form, std::move(file)));
 }
 
 } // namespace pallax

@@ -30,7 +30,8 @@ struct RecordingError {
     std::string sentence;
 };
 
-/// A recording, read packet by packet: pcap or pcapng, microsecond or nanosecond stamps.
+/// A recording, read packet by packet: pcap or pcapng, microsecond or nanosecond stamps, plain or
+/// compressed with gzip or zstd.
 class Recording {
 public:
     using OpenResult = Result<std::unique_ptr<Recording>, RecordingError>;
@@ -52,6 +53,8 @@ public:
     virtual const std::string& name() const = 0; ///< as given; "standard input" for "-"
     /// Whether it can be read only once: standard input, a named pipe or a device.
     virtual bool isStream() const { return false; }
+    /// "pcap", "pcapng", "gzip of pcap", …
+    virtual std::string format() const { return {}; }
     virtual int linkType() const = 0;
     /// Null for an unknown link type; callers that know the technology from an option may ignore
     /// that.
@@ -60,7 +63,7 @@ public:
     virtual RecordingError foreignLinkType() const = 0;
     /// The next packet; nothing at the end, or when `error` is set.
     virtual std::optional<RecordedPacket> next() = 0;
-    /// How many bytes of the file have been read; nothing for a pipe.
+    /// How many bytes of the file have been read, in its compressed form; nothing for a pipe.
     virtual std::optional<std::uint64_t> position() const { return std::nullopt; }
     /// Set once `next` has returned nothing because the recording is truncated in a packet or
     /// cannot be read further.

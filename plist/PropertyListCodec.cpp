@@ -39,11 +39,23 @@ std::string CodecError::text() const {
     return "at byte " + std::to_string(offset) + ": " + reason;
 }
 
-PropertyListResult parsePropertyList(Bytes bytes) {
+PropertyListForm formOf(Bytes bytes) {
     if (headOf(bytes, 0, kBinarySignature.size()) == kBinarySignature) {
-        return parseBinaryPropertyList(bytes);
+        return PropertyListForm::Binary;
     }
-    return looksLikeXml(bytes) ? parseXmlPropertyList(bytes) : parseTextPropertyList(bytes);
+    return looksLikeXml(bytes) ? PropertyListForm::Xml : PropertyListForm::Text;
+}
+
+PropertyListResult parsePropertyList(Bytes bytes) {
+    switch (formOf(bytes)) {
+    case PropertyListForm::Binary:
+        return parseBinaryPropertyList(bytes);
+    case PropertyListForm::Xml:
+        return parseXmlPropertyList(bytes);
+    case PropertyListForm::Text:
+        break;
+    }
+    return parseTextPropertyList(bytes);
 }
 
 } // namespace pallax

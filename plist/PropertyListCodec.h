@@ -33,7 +33,12 @@ inline constexpr std::size_t kDeepestPropertyList = 512;
 /// byte; forms without references cannot reach it.
 inline constexpr std::size_t kMostExpandedValues = std::size_t{1} << 16U;
 
-/// Reads any of the three forms, detected by the first bytes.
+enum class PropertyListForm { Xml, Binary, Text };
+
+/// The form that the first bytes have; any other bytes would be the text form.
+PropertyListForm formOf(Bytes bytes);
+
+/// Reads any of the three forms.
 PropertyListResult parsePropertyList(Bytes bytes);
 
 /// UTF-8 only. A document type is skipped, never fetched, and refused if it contains declarations;

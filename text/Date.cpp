@@ -41,6 +41,10 @@ std::string dateText(Date date) {
     return civilText("%04d-%02d-%02d %02d:%02d:%02d +0000", civilOf(date));
 }
 
+std::string localDateText(Time time, std::chrono::seconds aheadOfUtc) {
+    return civilText("%04d-%02d-%02d %02d:%02d:%02d", civilOf(dateOf(time) + aheadOfUtc));
+}
+
 std::optional<std::string> isoDateText(Date date) {
     const Civil civil = civilOf(date);
     if (civil.day.year() < std::chrono::year(0) || civil.day.year() > std::chrono::year(9999)) {

@@ -21,6 +21,9 @@ inline constexpr Time kLatestTime{std::chrono::seconds(9'000'000'000)};
 /// "2023-11-14 22:13:20 +0000": the standard textual description, in UTC.
 std::string dateText(Date date);
 
+/// "2023-11-14 23:13:20": the local time where it is so much ahead of UTC, to the second.
+std::string localDateText(Time time, std::chrono::seconds aheadOfUtc);
+
 /// "2023-11-14T22:13:20Z", the form of XML property lists; nothing for dates outside the years 0000
 /// to 9999.
 std::optional<std::string> isoDateText(Date date);

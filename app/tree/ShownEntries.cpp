@@ -6,8 +6,6 @@ namespace pallax {
 
 namespace {
 
-/// Asks for a dictionary's entries in sorted order; never shown.
-constexpr std::string_view kSortedKey = "_sorted";
 constexpr char kSortSeparator = ';';
 
 /// The name of a key in a sorted dictionary: the second of exactly two parts, otherwise the whole

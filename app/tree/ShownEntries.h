@@ -9,6 +9,9 @@
 
 namespace pallax {
 
+/// Asks for a dictionary's entries in sorted order; never shown.
+inline constexpr std::string_view kSortedKey = "_sorted";
+
 /// An entry of a display dictionary as a row. Its members refer to the dictionary and are valid
 /// until its next change.
 struct ShownEntry {

@@ -67,7 +67,8 @@ private:
 TEST_F(EndToEndClosedPipe, EndsHelpAndVersion) {
     endsQuietly({"--help"});
     endsQuietly({"--version"});
-    for (const char* command : {"decode", "record", "service", "demo", "simulate", "fields"}) {
+    for (const char* command :
+         {"decode", "record", "service", "demo", "simulate", "fields", "info"}) {
         endsQuietly({command, "--help"});
     }
 }
@@ -77,6 +78,11 @@ TEST_F(EndToEndClosedPipe, EndsTheTextsForPackages) {
         endsQuietly({"completion", shell});
     }
     endsQuietly({"manual", "pallax-decode"});
+}
+
+TEST_F(EndToEndClosedPipe, EndsInfo) {
+    endsQuietly({"info", lteDrive});
+    endsQuietlyAfterTheBeginning({"info", "--json", lteDrive});
 }
 
 TEST_F(EndToEndClosedPipe, EndsFields) {

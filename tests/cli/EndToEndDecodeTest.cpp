@@ -123,6 +123,60 @@ TEST_F(EndToEnd, DecodeReadsStandardInput) {
     EXPECT_EQ(run({"decode", "-"}, recording).out, run({"decode", recording}).out);
 }
 
+TEST_F(EndToEnd, DecodeAtATimeIsTheDisplayOfARecordingThatEndsThere) {
+    const std::vector<Packet> packets{{std::chrono::milliseconds(0), registration(0)},
+                                      {std::chrono::seconds(5), registration(1)},
+                                      {std::chrono::seconds(9), registration(0)}};
+    const std::string whole = record("whole.pcap", packets);
+    const std::string cut = record("cut.pcap", {packets[0], packets[1]});
+    const std::string expected = run({"decode", cut}).out;
+    EXPECT_NE(expected, run({"decode", whole}).out);
+    for (const char* time : {"+5s", "-4s", "22:13:26", "2023-11-14T22:13:28.999Z",
+                             "2023-11-14 "
+                             "22:13:25"}) {
+        const Run at = run({"decode", "--at", time, whole});
+        EXPECT_EQ(at.out, expected) << time;
+        EXPECT_EQ(at.err, "");
+        EXPECT_EQ(at.status, 0);
+    }
+    EXPECT_EQ(run({"decode", "--at", "+5s", "-"}, whole).out, expected);
+    const Run pipe = run({"decode", "--at", "end", "-"}, whole);
+    EXPECT_EQ(pipe.status, 1);
+    EXPECT_EQ(pipe.err,
+              "pallax: standard input: \"end\" cannot be used: the end of a stream is not "
+              "known before it has been read.\n");
+}
+
+TEST_F(EndToEnd, DecodeOfEveryFieldIsTheWholeTable) {
+    for (const char* sample :
+         {"cdma-drive", "gsm-attach", "lte-drive", "umts-drive", "utran-drive"}) {
+        const std::string path = PALLAX_SOURCE_DIR "/samples/" + std::string(sample) + ".pcap";
+        EXPECT_EQ(run({"decode", "--format", "csv", "--select", "*", path}).out,
+                  run({"decode", "--format", "csv", path}).out)
+            << sample;
+    }
+    const Run unknown = run({"decode", "--select", "lte.no_such_field", gsmAttach()});
+    EXPECT_EQ(unknown.status, 2);
+    EXPECT_EQ(unknown.err,
+              "pallax: No field is named \"lte.no_such_field\" (see pallax fields).\n");
+}
+
+TEST_F(EndToEnd, DecodeOfPartsThatARecorderWroteIsThatOfTheWhole) {
+    const std::vector<Packet> packets{{std::chrono::milliseconds(0), registration(0)},
+                                      {std::chrono::seconds(5), registration(1)},
+                                      {std::chrono::seconds(9), registration(0)}};
+    const std::string whole = record("whole.pcap", packets);
+    const std::string first = record("part-0001.pcap", {packets[0]});
+    const std::string second = record("part-0002.pcap", {packets[1], packets[2]});
+    for (const char* every : {"end", "tick", "packet"}) {
+        EXPECT_EQ(run({"decode", "--every", every, "--join", second, first}).out,
+                  run({"decode", "--every", every, whole}).out);
+    }
+    const Run stream = run({"decode", "--join", first, "-"}, second);
+    EXPECT_EQ(stream.status, 1);
+    EXPECT_EQ(stream.err, "pallax: - cannot be joined: it can be read only once.\n");
+}
+
 TEST_F(EndToEnd, TheSystemLogIsWrittenUnmaskedToItsFile) {
     const std::string recording = record("a.pcap", {{milliseconds(0), registration(0)}});
     const std::string log = world.path("log");

@@ -52,11 +52,12 @@ TEST_F(EndToEndDescriptors, AClosedStandardOutputIsNoSuccessAndNoRecordingIsWrit
     const std::string content = contentOf(gsmAttach());
     const std::string sentence =
         "pallax: Standard output cannot be written: Bad file descriptor.\n";
-    for (const char* line : {"cp gsm-attach.pcap a.pcap && PALLAX decode gsm-attach.pcap a.pcap "
-                             "--jobs 1 --every packet >&- 2>err",
-                             "PALLAX decode gsm-attach.pcap a.pcap --jobs 2 >&- 2>err",
-                             "PALLAX fields >&- 2>err", "PALLAX fields --json >&- 2>err",
-                             "PALLAX --help >&- 2>err", "PALLAX a.pcap --print >&- 2>err"}) {
+    for (const char* line :
+         {"cp gsm-attach.pcap a.pcap && PALLAX decode gsm-attach.pcap a.pcap "
+          "--jobs 1 --every packet >&- 2>err",
+          "PALLAX decode gsm-attach.pcap a.pcap --jobs 2 >&- 2>err", "PALLAX fields >&- 2>err",
+          "PALLAX fields --json >&- 2>err", "PALLAX info gsm-attach.pcap >&- 2>err",
+          "PALLAX --help >&- 2>err", "PALLAX a.pcap --print >&- 2>err"}) {
         EXPECT_EQ(shell(line), 1) << line;
         EXPECT_EQ(contentOf(world.path("err")), sentence) << line;
         EXPECT_EQ(contentOf(world.path("gsm-attach.pcap")), content);

@@ -178,6 +178,13 @@ TEST_F(EndToEndStatus, OfFields) {
     expectEveryDocumentedStatus({"fields"});
 }
 
+TEST_F(EndToEndStatus, OfInfo) {
+    ends({{"info", sample}, 0, ""});
+    ends({{"info", missing, sample}, 1, isMissing});
+    ends({{"info"}, 2, "pallax: RECORDING is required (see pallax info --help)\n"});
+    expectEveryDocumentedStatus({"info"});
+}
+
 TEST_F(EndToEndStatus, OfTheTextsForPackages) {
     const std::string full =
         "pallax: Standard output cannot be written: No space left on device.\n";

@@ -92,6 +92,40 @@ TEST(Options, DecodeWritesTheLastDisplayAsJsonUnlessToldOtherwise) {
     EXPECT_TRUE(told.strict);
 }
 
+TEST(Options, DecodeTakesAPartOfARecording) {
+    const auto part =
+        parsed<DecodeOptions>({"decode", "--from", "+90s", "--to", "14:03", "--select", "lte.*",
+                               "--select", "gsm.?", "--typed", "--join", "a.pcap", "b.pcap"});
+    EXPECT_TRUE(part.window.from && part.window.to);
+    EXPECT_EQ(part.select, (std::vector<std::string>{"lte.*", "gsm.?"}));
+    EXPECT_EQ(part.recordings, (std::vector<std::string>{"a.pcap", "b.pcap"}));
+    EXPECT_TRUE(part.typed);
+    EXPECT_TRUE(part.join);
+    EXPECT_FALSE(part.recordingColumn);
+    const auto at = parsed<DecodeOptions>(
+        {"decode", "--at", "-5m", "--format", "csv", "--recording-column", "a.pcap"});
+    EXPECT_EQ(at.chosenEvery(), Every::End);
+    EXPECT_TRUE(at.chosenWindow().to && !at.chosenWindow().from);
+    EXPECT_TRUE(at.recordingColumn);
+    const auto refused = [](std::vector<std::string> arguments) {
+        arguments.insert(arguments.begin(), {"decode", "a.pcap"});
+        const ParseEnd end = ended(arguments);
+        EXPECT_EQ(end.status, kExitWrongUsage);
+        return end.text;
+    };
+    EXPECT_EQ(refused({"--at", "noon"}),
+              "pallax: --at: \"noon\" is not a time: expected 14:03, 2023-11-14T14:03, +90s, -5m, "
+              "start or end (character 1) (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--at", "end", "--every", "tick"}),
+              "pallax: --every excludes --at (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--at", "end", "--to", "end"}),
+              "pallax: --to excludes --at (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--recording-column"}),
+              "pallax: --recording-column requires --format csv (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--format", "csv", "--typed"}),
+              "pallax: --typed requires --format json (see pallax decode --help)\n");
+}
+
 TEST(Options, DecodeTakesEveryTechnology) {
     for (const char* name : {"ifx", "gsm", "cdma", "lte", "utran"}) {
         EXPECT_EQ(
@@ -225,6 +259,12 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
               "service --help)\n");
 }
 
+TEST(Options, InfoTakesFiles) {
+    const auto info = parsed<InfoOptions>({"info", "a.pcap", "--json", "-"});
+    EXPECT_EQ(info.files, (std::vector<std::string>{"a.pcap", "-"}));
+    EXPECT_TRUE(info.json);
+}
+
 TEST(Options, FieldsAreOfEveryTechnologyUnlessOneIsNamed) {
     const auto plain = parsed<FieldsOptions>({"fields"});
     EXPECT_EQ(plain.technology, nullptr);
@@ -261,7 +301,7 @@ TEST(Options, TheHelpOfExplainNamesEveryTopic) {
 
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
     for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "fields",
-                                "explain", "completion", "manual"}) {
+                                "explain", "info", "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);

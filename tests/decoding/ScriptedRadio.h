@@ -98,6 +98,7 @@ public:
           _atEnd(std::move(atEnd)) {}
 
     const std::string& name() const override { return _name; }
+    std::string format() const override { return "script"; }
     int linkType() const override { return _technology != nullptr ? _technology->linkType : 1; }
     const RecordedTechnology* technology() const override { return _technology; }
     RecordingError foreignLinkType() const override {

@@ -56,6 +56,7 @@ constexpr const char* kSurroundings = R"sh(
 cp samples/lte-drive.pcap drive.pcap
 cp samples/gsm-attach.pcap other.pcap
 mkdir monday && cp samples/lte-drive.pcap samples/cdma-drive.pcap monday
+mkdir parts && cp samples/lte-drive.pcap parts/drive-0001.pcapng
 cat >"$BIN/modem-dump" <<'END'
 #!/bin/sh
 head -c 24 samples/lte-drive.pcap

@@ -1,4 +1,4 @@
-#include "browsing/ZoneText.h"
+#include "platform/ZoneText.h"
 
 #include "text/Format.h"
 
@@ -12,6 +12,11 @@ std::string zoneText(const Clock::Zone& zone) {
     return formatText("%@%02d%02d",
                       {zone.offset.count() < 0 ? "-" : "+", static_cast<int>(whole.count()),
                        static_cast<int>((offset - whole).count())});
+}
+
+std::string localTimeText(Time time, const Clock& clock) {
+    const Clock::Zone zone = clock.zone(time);
+    return formatText("%@ %@", {localDateText(time, zone.offset), zoneText(zone)});
 }
 
 } // namespace pallax

@@ -1,0 +1,115 @@
+#include "cli/OptionParts.h"
+#include "cli/Options.h"
+
+namespace pallax {
+
+namespace {
+
+constexpr const char* kDecodeFooter = R"(Examples:
+  pallax decode drive.pcap
+  pallax decode --every tick drive.pcap | jq .display
+  pallax decode --every packet --format csv --technology lte raw.pcap
+  pallax decode --system-log drive.log drive.pcap
+  pallax decode --at 14:03:20 drive.pcap
+  pallax decode --every tick --from +90s --to -5m drive.pcap
+  pallax decode --format csv --select '*.measured_rsrp' drive.pcap
+  pallax decode --join drive-0001.pcapng drive-0002.pcapng
+
+Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
+standard input; a recording may be a named pipe, and compressed with gzip or
+zstd. Displays from a pipe are written without delay; several pipes are read in
+parallel and written one after the other. On a terminal, runs of more than two
+seconds show their progress, and characters that could command the terminal are
+escaped (\x1B, \u202E); CSV in files and pipes is as the modem sent it.
+
+A TIME is a local time (14:03 or 14:03:20.5, the first in the recording), a date
+with or without a time and a zone (2023-11-14T14:03Z, "2023-11-14 14:03"), a
+distance from the start (+90s, +1h30m) or before the end (-5m), or start or end.
+The end of a pipe is not known. Packets before --from are decoded, but only
+displays from then on are written. Reading ends at the first packet after --to
+or --at.
+
+A FIELD is a name that pallax fields lists; * stands for any letters. --typed
+writes a number as {"number":-94.75,"unit":"dBm","text":"-94.75 dBm"}.
+
+With --join the recordings must have one technology. They are read in the order
+of their first packets, and each continues the state of the one before.
+
+Exit status:
+  0   success, or the reader of the output has gone
+  1   failure: cannot read a recording or template, or write the output
+  2   wrong usage
+  70  with --strict: ended by a fatal record)";
+
+void addChoices(CLI::App& app, DecodeOptions& options) {
+    addTechnology(app, "--technology", options.technology,
+                  "The technology of the recordings (default: from their link type)");
+    addChoice<std::optional<Every>>(
+        app, "--every", options.every,
+        {{"end", Every::End}, {"tick", Every::Tick}, {"packet", Every::Packet}},
+        "When to write the display (default: end; for csv, tick)");
+    addChoice<DecodeFormat>(app, "--format", options.format,
+                            {{"json", DecodeFormat::Json}, {"csv", DecodeFormat::Csv}},
+                            "JSON, one object per line, or CSV (default: json)");
+}
+
+void addTimes(CLI::App& app, DecodeOptions& options) {
+    addTime(app, "--from", options.window.from, "Write no displays before this time");
+    addTime(app, "--to", options.window.to, "Stop reading after this time");
+    addTime(app, "--at", options.at, "Write the display at this time only")
+        ->excludes("--every")
+        ->excludes("--from")
+        ->excludes("--to");
+}
+
+void addContent(CLI::App& app, DecodeOptions& options) {
+    app.add_option_function<std::vector<std::string>>(
+           "--select",
+           [&options](const std::vector<std::string>& names) {
+               options.select.insert(options.select.end(), names.begin(), names.end());
+           },
+           "Write only these fields (repeat it for several)")
+        ->expected(1)
+        ->take_all()
+        ->type_name("FIELD");
+    app.add_flag("--typed", options.typed, "JSON: numbers with their units, as objects");
+    app.add_flag("--recording-column", options.recordingColumn,
+                 "CSV: the name of the recording, as the first column");
+}
+
+} // namespace
+
+void addDecode(CLI::App& app, DecodeOptions& options) {
+    addChoices(app, options);
+    addTimes(app, options);
+    addContent(app, options);
+    app.add_option("--system-log", options.systemLog, "Write every system-log line to this file")
+        ->type_name("FILE");
+    constexpr unsigned kMostJobs = 1024;
+    app.add_option_function<std::string>(
+           "--jobs",
+           [&options](const std::string& text) {
+               options.jobs = numberOf("--jobs", text, 1U, kMostJobs);
+           },
+           "How many recordings to decode at once (default: one per core)")
+        ->type_name("N");
+    app.add_flag("--join", options.join, "The recordings are one, in the order of their times");
+    app.add_flag("--strict", options.strict,
+                 "Exit with status 70 at a record that cannot be read instead of skipping it");
+    app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
+        ->required()
+        ->type_name("");
+    app.footer(kDecodeFooter);
+}
+
+std::string decodeRefusal(const DecodeOptions& options) {
+    if (options.recordingColumn && options.format != DecodeFormat::Csv) {
+        return "--recording-column requires --format csv";
+    }
+    if (options.typed && options.format != DecodeFormat::Json) {
+        return "--typed requires --format json";
+    }
+    return {};
+}
+
+} // namespace pallax

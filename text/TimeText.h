@@ -1,0 +1,61 @@
+#pragma once
+
+#include "text/Date.h"
+#include "text/Result.h"
+
+#include <chrono>
+#include <cstddef>
+#include <functional>
+#include <optional>
+#include <string>
+#include <string_view>
+
+/// Times as people write them on a command line:
+///
+///   start, end                 of the recording
+///   +90s, +1h30m               after its start; -5m, before its end
+///   14:03, 14:03:20.5          local time, the first that lies in the recording
+///   2023-11-14T14:03:20.5      local time; also with a blank in place of the T, or the date alone
+///   2023-11-14T14:03Z, …+0200  with a zone
+namespace pallax {
+
+/// What a recording's times lie between, both within kEarliestTime to kLatestTime.
+struct TimeSpan {
+    Time begin;
+    std::optional<Time> end; ///< nothing while it is not known, as for a pipe
+};
+
+/// Local time minus UTC, at a time.
+using ZoneRule = std::function<std::chrono::seconds(Time time)>;
+
+struct TimeTextError {
+    std::string sentence; ///< quotes the text and names the place
+    std::size_t place;    ///< the index of the first byte that is wrong
+};
+
+/// A time as it was written, by itself. Which time it is depends on the recording.
+class TimeText {
+public:
+    /// Any text that is not a time is refused.
+    static Result<TimeText, TimeTextError> parse(std::string_view text);
+
+    /// The time, limited to kEarliestTime to kLatestTime. An error if a local time lies in no part
+    /// of the recording, or if the end is needed but not known. A local time that its zone skips
+    /// or has twice is the first that the clock can have meant.
+    Result<Time, TimeTextError> timeIn(const TimeSpan& span, const ZoneRule& zone) const;
+
+    /// Whether `timeIn` depends on the end of the recording.
+    bool needsEnd() const { return _kind == Kind::BeforeEnd || _kind == Kind::Clock; }
+
+private:
+    friend class TimeTextParser;
+    enum class Kind { AfterStart, BeforeEnd, Clock, Local, Utc };
+    Result<Time, TimeTextError> clockIn(const TimeSpan& span, const ZoneRule& zone) const;
+
+    std::string _text;
+    Kind _kind = Kind::AfterStart;
+    /// The distance from start or end; the time since midnight; since the epoch, local or UTC.
+    std::chrono::nanoseconds _size{0};
+};
+
+} // namespace pallax
