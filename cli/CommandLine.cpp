@@ -90,6 +90,7 @@ CommandLine::CommandLine()
     addView(demo, _demo);
     addSimulate(addCommand("simulate", "Write a simulated modem's packets to a recording"),
                 _simulate);
+    addEvents(addCommand("events", "List what happened in recordings"), _events);
     addFields(addCommand("fields", "List every field of the display"), _fields);
     addExplain(addCommand("explain", "Explain a channel, a network code, a field or a value"),
                _explain);
@@ -194,6 +195,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("simulate")) {
         return _simulate;
+    }
+    if (_app->got_subcommand("events")) {
+        return _events;
     }
     if (_app->got_subcommand("fields")) {
         return _fields;

@@ -37,6 +37,7 @@ private:
     BrowseOptions _demo;
     DecodeOptions _decode;
     ExplainOptions _explain;
+    EventsOptions _events;
     FieldsOptions _fields;
     InfoOptions _info;
     RecordOptions _record;

@@ -23,6 +23,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax decode --every tick --format csv drive.pcap > drive.csv
   pallax record drive.pcapng           record the live modem
   pallax service --play drive.pcap     play a recording to viewers
+  pallax events drive.pcap             list cell changes and other events
   pallax fields | grep -i rsrp         look up a field
   pallax explain earfcn 1850           what a number, a code or a field means
   pallax info drive.pcap               what a recording holds
@@ -35,6 +36,27 @@ Exit status:
   1   failure, explained in one sentence on standard error
   2   wrong usage
   70  ended by a fatal record (--keep-going drops it instead))";
+
+constexpr const char* kEventsFooter = R"(Examples:
+  pallax events drive.pcap
+  pallax events --json drive.pcap | jq -r 'select(.kind == "ping-pong").time'
+  modem-dump | pallax events -
+
+A line has the local time, the kind and the words of an event: cell-change,
+ping-pong (back in the cell before within 10 s), state-change,
+technology-change, service-lost, service-regained, context-up, context-down,
+gap (no packets for a minute), time-step (the clock was set back) or
+fatal-record. In JSON, the time is UTC, "packet" is the packet that shows the
+event, and "fields" names its fields. What a modem does not tell has no events.
+
+A record that cannot be read ends the events of its recording. Events from a
+pipe are written when they happen.
+
+Exit status:
+  0   success, or the reader of the output has gone
+  1   failure: cannot read a recording or template, or write the output
+  2   wrong usage
+  70  ended by a fatal record)";
 
 constexpr const char* kFieldsFooter = R"(Examples:
   pallax fields lte
@@ -156,6 +178,16 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
     addView(app, options);
     addPlay(app, options.play, recording);
     app.footer(kFooter);
+}
+
+void addEvents(CLI::App& app, EventsOptions& options) {
+    addTechnology(app, "--technology", options.technology,
+                  "The technology of the recordings (default: from their link type)");
+    app.add_flag("--json", options.json, "JSON, one object per line");
+    app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
+        ->required()
+        ->type_name("");
+    app.footer(kEventsFooter);
 }
 
 void addFields(CLI::App& app, FieldsOptions& options) {

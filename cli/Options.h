@@ -3,6 +3,7 @@
 #include "browsing/BrowseOptions.h"
 #include "console/ExitStatus.h"
 #include "decoding/DecodeCommand.h"
+#include "decoding/EventsCommand.h"
 #include "decoding/FieldsCommand.h"
 #include "decoding/InfoCommand.h"
 #include "explaining/ExplainCommand.h"
@@ -29,9 +30,9 @@ struct ParseEnd {
 /// `pallax service --status`.
 struct ServiceStatusOptions {};
 
-using ParsedOptions =
-    std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
-                 SimulateOptions, FieldsOptions, ExplainOptions, InfoOptions, ParseEnd>;
+using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions,
+                                   ServiceStatusOptions, SimulateOptions, EventsOptions,
+                                   FieldsOptions, ExplainOptions, InfoOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);
@@ -39,6 +40,7 @@ void addDecode(CLI::App& app, DecodeOptions& options);
 /// Why the options contradict each other; otherwise empty.
 std::string decodeRefusal(const DecodeOptions& options);
 void addExplain(CLI::App& app, ExplainOptions& options);
+void addEvents(CLI::App& app, EventsOptions& options);
 void addFields(CLI::App& app, FieldsOptions& options);
 void addRecord(CLI::App& app, RecordOptions& options);
 /// The options of all ways of browsing.

@@ -30,6 +30,7 @@ struct Run {
         return printServiceStatus() == 0 ? kExitSuccess : kExitFailure;
     }
     ExitStatus operator()(const SimulateOptions& options) const { return runSimulate(options); }
+    ExitStatus operator()(const EventsOptions& options) const { return runEvents(options); }
     ExitStatus operator()(const FieldsOptions& options) const { return runFields(options); }
     ExitStatus operator()(const ExplainOptions& options) const { return runExplain(options); }
     ExitStatus operator()(const InfoOptions& options) const { return runInfo(options); }

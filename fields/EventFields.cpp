@@ -19,6 +19,7 @@ constexpr std::array<Names, 3> kOneXCell{"cdma.system_identity.base_station_id",
                                          "cdma.system_identity.network_id",
                                          "cdma.system_identity.system_id"};
 constexpr std::array<Names, 2> kEvdoCell{"cdma.ev_do.serving_pn_offset", "cdma.ev_do.channel"};
+constexpr std::array<Names, 1> kNoPilot{"Invalid Value"};
 constexpr std::array<Names, 2> kLteCell{"lte.serving_cell_info.physical_cell_id",
                                         "lte.serving_cell_info.download_frequency"};
 constexpr std::array<Names, 2> kLteMeasuredCell{"lte.serving_cell_measurements.physical_cell_id",
@@ -88,7 +89,7 @@ constexpr auto kRows = std::to_array<EventFields>({
     {"gsm", Watch::Contexts, "context", kGsmContexts},
 
     {"cdma", Watch::Cell, "1x serving cell", kOneXCell},
-    {"cdma", Watch::Cell, "EV-DO serving cell", kEvdoCell},
+    {"cdma", Watch::Cell, "EV-DO serving cell", kEvdoCell, {}, kNoPilot},
     {"cdma", Watch::State, "1x", kOneXState},
     {"cdma", Watch::State, "EV-DO", kEvdoState},
     {"cdma", Watch::State, "EV-DO session", kEvdoSession},

@@ -39,8 +39,8 @@ struct EventFields {
     std::span<const std::string_view> fields;
     /// Of Service: the values of a phone that has it; if there are none, any value.
     std::span<const std::string_view> good = {};
-    /// Of Service: the values of a phone that has lost it, as it has when the field is removed.
-    /// Values in neither change nothing.
+    /// Of a Cell: values of the first field that name none. Of Service: the values of a phone that
+    /// has lost it, as it has when the field is removed. Values in neither change nothing.
     std::span<const std::string_view> bad = {};
 };
 

@@ -65,6 +65,9 @@ public:
     virtual std::optional<RecordedPacket> next() = 0;
     /// How many bytes of the file have been read, in its compressed form; nothing for a pipe.
     virtual std::optional<std::uint64_t> position() const { return std::nullopt; }
+    /// Goes on at a position that was given before a packet. Only for a file in which nothing but
+    /// packets follows the first packet. False if this is not possible.
+    virtual bool seek(std::uint64_t /*position*/) { return false; }
     /// Set once `next` has returned nothing because the recording is truncated in a packet or
     /// cannot be read further.
     virtual const std::optional<RecordingError>& error() const = 0;

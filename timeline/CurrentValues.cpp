@@ -99,7 +99,7 @@ void CurrentValues::sampleInEntry(Open& open, const Sample& sample) {
             open.isAnother = true;
         }
         auto& [heldField, value] = values[open.held++];
-        if (_fields->identifies(field) && (heldField != field || !shows(value, sample.value))) {
+        if (heldField != field || (_fields->identifies(field) && !shows(value, sample.value))) {
             open.isAnother = true;
         }
         heldField = field;

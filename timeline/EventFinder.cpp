@@ -128,10 +128,16 @@ bool EventFinder::isOvershadowed(const Row& row) const {
 
 void EventFinder::lookAtCell(Row& row, const Moment& moment) {
     std::vector<std::string> cell = textsOf(moment.values, row.fields);
-    if (cell.front().empty() || cell == row.value) {
-        return;
+    if (cell.front().empty() || isAmong(row.rule->bad, cell.front())) {
+        return; // no cell is named
     }
     const bool isSame = row.isKnown && cell.front() == row.value.front();
+    for (std::size_t index = 1; isSame && index < cell.size(); ++index) {
+        cell[index] = cell[index].empty() ? row.value[index] : cell[index];
+    }
+    if (cell == row.value) {
+        return;
+    }
     const bool isCompleted =
         isSame && std::find(row.value.begin(), row.value.end(), "") != row.value.end();
     if (isCompleted || (isSame && moment.time - row.since <= kSettling)) {

@@ -2,7 +2,9 @@
 
 #include "fields/Reference.h"
 #include "platform/RecordedTechnology.h"
+#include "platform/SystemLog.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace pallax {
@@ -19,6 +21,7 @@ std::string keyIn(std::string_view section, std::string_view key) {
 
 FieldTable::FieldTable(const RecordedTechnology& technology, const Resources& resources)
     : _technology(technology.commandName) {
+    const MutedSystemLog muted; // making records is logged
     const TechnologyReference reference = gatherReference(technology, resources);
     _isObjectStream = codesOf(reference).empty();
     const FieldRegistry registry(reference);

@@ -71,7 +71,10 @@ SeriesValue SeriesStore::valueOf(const FieldValue& value) {
 }
 
 void SeriesStore::beginPacket(std::uint64_t number, Time time) {
-    while ((number - 1) >> _shift >= _limits.cells || _runCount > _limits.runs) {
+    while ((number - 1) >> _shift >= _limits.cells) {
+        halveCells();
+    }
+    while (_runCount > _limits.runs) {
         const std::size_t before = _runCount;
         halveCells();
         // Many short series, which larger cells hardly make shorter, must not become more.

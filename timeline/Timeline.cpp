@@ -27,16 +27,17 @@ std::uint64_t Timeline::firstInstant() const {
 }
 
 const Stretch* Timeline::stretchOf(Time time) const {
-    const Stretch* begun = nullptr;
+    const Stretch* nearest = nullptr;
     for (const Stretch& stretch : _stretches) {
         if (stretch.first <= time) {
             if (time <= stretch.latest) {
                 return &stretch;
             }
-            begun = &stretch;
+            const bool isNearer = nearest == nullptr || stretch.latest > nearest->latest;
+            nearest = isNearer ? &stretch : nearest;
         }
     }
-    return begun;
+    return nearest;
 }
 
 std::optional<std::uint64_t> Timeline::instantAt(Time time) const {

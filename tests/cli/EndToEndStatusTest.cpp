@@ -185,6 +185,18 @@ TEST_F(EndToEndStatus, OfInfo) {
     expectEveryDocumentedStatus({"info"});
 }
 
+TEST_F(EndToEndStatus, OfEvents) {
+    const std::string drive = world.path("drive.pcap");
+    ends({{"simulate", "gsm", "--seconds", "60", "-o", drive}, 0, ""});
+    ends({{"events", drive}, 0, ""});
+    ends({{"events", "--json", drive},
+          1,
+          "pallax: Standard output cannot be written: No space left on device.\n",
+          "/dev/null",
+          "/dev/full"});
+    ends({{"events"}, 2, "pallax: RECORDING is required (see pallax events --help)\n"});
+}
+
 TEST_F(EndToEndStatus, OfTheTextsForPackages) {
     const std::string full =
         "pallax: Standard output cannot be written: No space left on device.\n";

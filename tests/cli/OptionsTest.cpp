@@ -299,9 +299,17 @@ TEST(Options, TheHelpOfExplainNamesEveryTopic) {
     }
 }
 
+TEST(Options, EventsAreOfRecordings) {
+    const auto told = parsed<EventsOptions>({"events", "a", "--json", "b", "--technology", "gsm"});
+    EXPECT_EQ(told.recordings, (std::vector<std::string>{"a", "b"}));
+    EXPECT_TRUE(told.json);
+    EXPECT_EQ(told.technology->commandName, "gsm");
+    EXPECT_EQ(ended({"events"}).status, kExitWrongUsage);
+}
+
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
-    for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "fields",
-                                "explain", "info", "completion", "manual"}) {
+    for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "events",
+                                "fields", "explain", "info", "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);

@@ -33,7 +33,8 @@ TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
     EXPECT_EQ(manualPages(program()),
               (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record",
                                         "pallax-service", "pallax-demo", "pallax-simulate",
-                                        "pallax-fields", "pallax-explain", "pallax-info"}));
+                                        "pallax-events", "pallax-fields", "pallax-explain",
+                                        "pallax-info"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 

@@ -1,0 +1,185 @@
+#include "decoding/EventsCommand.h"
+
+#include "LogGenerator/Technologies/Technologies.h"
+#include "console/Output.h"
+#include "decoding/DisplayJson.h"
+#include "decoding/DroppedNotices.h"
+#include "decoding/Preconditions.h"
+#include "decoding/RequiredTemplates.h"
+#include "host/BuildBundle.h"
+#include "host/Complaint.h"
+#include "host/WallClock.h"
+#include "text/Format.h"
+#include "timeline/Timeline.h"
+
+#include <memory>
+#include <unistd.h>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+/// A recording that is read once, from its start, and not kept.
+class PassingJournal final : public PacketJournal {
+public:
+    /// `beforePacket` is called before each packet is waited for.
+    PassingJournal(Recording& recording, std::function<void()> beforePacket)
+        : _recording(recording), _beforePacket(std::move(beforePacket)) {}
+
+    std::unique_ptr<PacketReader> reader(std::uint64_t /*from*/) override {
+        return std::make_unique<Reader>(*this);
+    }
+
+private:
+    class Reader final : public PacketReader {
+    public:
+        explicit Reader(PassingJournal& journal) : _journal(journal) {}
+        std::optional<JournalPacket> next() override {
+            _journal._beforePacket();
+            const auto packet = _journal._recording.next();
+            return packet ? std::optional(JournalPacket{++_number, packet->time, packet->data})
+                          : std::nullopt;
+        }
+
+    private:
+        PassingJournal& _journal;
+        std::uint64_t _number = 0;
+    };
+
+    Recording& _recording;
+    std::function<void()> _beforePacket;
+};
+
+/// "2023-11-14 23:13:20.000", in local time.
+std::string localText(Time time, const Clock& zone) {
+    std::string text = isoTimeText(time + zone.zone(time).offset);
+    constexpr std::size_t kSeparator = 10;
+    text[kSeparator] = ' ';
+    text.pop_back(); // the mark of UTC
+    return text;
+}
+
+/// Writes the events that a timeline has found since the last call.
+class EventLines {
+public:
+    EventLines(const EventsOptions& options, const Clock& zone, const std::string& recording,
+               Output& output)
+        : _options(options), _zone(zone), _recording(recording), _output(output) {}
+
+    void writeNew(const Timeline& timeline) {
+        const std::uint64_t dropped = timeline.eventsDropped();
+        for (_next = std::max(_next, dropped); _next < dropped + timeline.events().size();
+             ++_next) {
+            write(timeline.events()[_next - dropped]);
+        }
+    }
+
+private:
+    void write(const Event& event) {
+        std::string& text = _output.text();
+        if (_options.json) {
+            appendJson(text, objectOf(event));
+        } else {
+            if (_options.recordings.size() > 1) {
+                text.append(_recording).append(": ");
+            }
+            constexpr std::size_t kKindWidth = 18;
+            std::string kind(wordOf(event.kind));
+            kind.resize(kKindWidth, ' ');
+            text.append(localText(event.time, _zone)).append("  ").append(kind);
+            text.append(event.words);
+        }
+        text += '\n';
+        _output.lineDone();
+    }
+
+    Dictionary objectOf(const Event& event) const {
+        return Dictionary{
+            {"recording", _recording},
+            {"time", isoTimeText(event.time)},
+            {"packet", PropertyList::unsignedInteger(event.packet)},
+            {"kind", std::string(wordOf(event.kind))},
+            {"words", event.words},
+            {"fields", Array(event.fields.begin(), event.fields.end())},
+        };
+    }
+
+    const EventsOptions& _options;
+    const Clock& _zone;
+    const std::string& _recording;
+    Output& _output;
+    std::uint64_t _next = 0;
+};
+
+} // namespace
+
+ExitStatus EventsCommand::run(Output& output) {
+    ExitStatus status = kExitSuccess;
+    for (const std::string& path : _options.recordings) {
+        const ExitStatus result = tell(path, output);
+        status = result == kExitSuccess ? status : result;
+        output.flush(); // the next recording may have to be waited for
+    }
+    return status;
+}
+
+ExitStatus EventsCommand::tell(const std::string& path, Output& output) {
+    const auto recording = _open(path);
+    if (!recording) {
+        _report(recording.error().sentence);
+        return kExitFailure;
+    }
+    const RecordedTechnology* technology =
+        _options.technology != nullptr ? _options.technology : (*recording)->technology();
+    if (technology == nullptr) {
+        _report((*recording)->foreignLinkType().sentence);
+        return kExitFailure;
+    }
+    return tellEvents(**recording, *technology, output);
+}
+
+ExitStatus EventsCommand::tellEvents(Recording& recording, const RecordedTechnology& technology,
+                                     Output& output) {
+    const bool isWaitedFor = !recording.position();
+    EventLines lines(_options, _zone, recording.name(), output);
+    const Timeline* index = nullptr;
+    PassingJournal journal(recording, [&] {
+        lines.writeNew(*index);
+        if (isWaitedFor) {
+            output.flush();
+        }
+    });
+    Timeline timeline(journal, {technology, _environment.resources, _environment.bundle,
+                                _environment.technologies});
+    index = &timeline;
+    (void)timeline.index();
+    lines.writeNew(timeline);
+    if (timeline.hasEnded()) {
+        const Event& fatal = timeline.events().back();
+        _report(formatText("%@: packet %llu cannot be read; the events end there.",
+                           {recording.name(), fatal.packet}));
+        return kExitFatalRecord;
+    }
+    if (recording.error()) {
+        _report(recording.error()->sentence);
+        return kExitFailure;
+    }
+    return kExitSuccess;
+}
+
+ExitStatus runEvents(const EventsOptions& options) {
+    const RequiredTemplates resources(DirectoryResources::programFolder());
+    const BuildBundle bundle;
+    const WallClock zone;
+    DroppedNotices notices;
+    const DecoderEnvironment environment{resources, bundle, notices, technologies()};
+    const auto report = [](std::string_view sentence) { complain(sentence); };
+    const auto open = [&report](const std::string& path) {
+        return Recording::openInput({path, {}, report});
+    };
+    Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
+    return EventsCommand(options, environment, open, report, zone).run(output);
+}
+
+} // namespace pallax

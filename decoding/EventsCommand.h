@@ -1,0 +1,52 @@
+#pragma once
+
+#include "console/ExitStatus.h"
+#include "decoding/DecodeCommand.h"
+
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace pallax {
+
+class Clock;
+class Output;
+
+/// `pallax events`: what happened in recordings.
+struct EventsOptions {
+    std::vector<std::string> recordings;
+    /// The technology of every recording, overriding its link type.
+    const RecordedTechnology* technology = nullptr;
+    bool json = false;
+};
+
+/// Writes a line for each event of the recordings, in the order of the command line: local time,
+/// kind and words, or a JSON object. Those of a pipe are written when they happen. A recording that
+/// cannot be read does not stop the others; a fatal record ends its recording.
+class EventsCommand {
+public:
+    /// `zone` tells the local time.
+    EventsCommand(const EventsOptions& options, const DecoderEnvironment& environment,
+                  DecodeCommand::Open open, DecodeCommand::Report report, const Clock& zone)
+        : _options(options), _environment(environment), _open(std::move(open)),
+          _report(std::move(report)), _zone(zone) {}
+
+    /// Exceptions of `output` and TemplateFailure propagate.
+    ExitStatus run(Output& output);
+
+private:
+    ExitStatus tell(const std::string& path, Output& output);
+    ExitStatus tellEvents(Recording& recording, const RecordedTechnology& technology,
+                          Output& output);
+
+    const EventsOptions& _options;
+    const DecoderEnvironment& _environment;
+    DecodeCommand::Open _open;
+    DecodeCommand::Report _report;
+    const Clock& _zone;
+};
+
+/// `EventsCommand`, wired to this machine.
+ExitStatus runEvents(const EventsOptions& options);
+
+} // namespace pallax

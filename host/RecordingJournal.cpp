@@ -1,0 +1,189 @@
+#include "host/RecordingJournal.h"
+
+#include "host/RecordingFile.h"
+#include "text/Format.h"
+
+#include <algorithm>
+#include <sys/stat.h>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+std::optional<std::uint64_t> sizeOf(const std::string& path) {
+    struct stat status {};
+    return ::stat(path.c_str(), &status) == 0
+               ? std::optional(static_cast<std::uint64_t>(status.st_size))
+               : std::nullopt;
+}
+
+/// Whether nothing but a packet lies between two positions, so that what a reader must know stands
+/// at the start of the file: pcap has a header of 16 bytes before each packet, pcapng at least a
+/// block around it.
+bool isPacketAlone(std::uint64_t from, std::uint64_t to, std::size_t length) {
+    constexpr std::uint64_t kPcapHeader = 16;
+    constexpr std::uint64_t kPcapNgBlock = 32;
+    constexpr std::uint64_t kWord = 4;
+    return to - from == kPcapHeader + length ||
+           to - from == kPcapNgBlock + (length + kWord - 1) / kWord * kWord;
+}
+
+} // namespace
+
+/// Reads on where the journal has noted a place, and notes further places.
+class RecordingJournal::Reader final : public PacketReader {
+public:
+    Reader(RecordingJournal& journal, std::uint64_t from) : _journal(journal), _from(from) {
+        start();
+    }
+
+    std::optional<JournalPacket> next() override {
+        for (;;) {
+            auto packet = readOne();
+            if (!packet || packet->number >= _from) {
+                return packet;
+            }
+        }
+    }
+
+private:
+    void start() {
+        _recording.reset();
+        if (!_journal.isSameFile()) {
+            return;
+        }
+        auto opened = Recording::open(_journal._path);
+        if (!opened) {
+            _journal._error = opened.error().sentence;
+            return;
+        }
+        _recording = std::move(opened).value();
+        _journal._error.reset();
+        _next = 1;
+        _expected.reset();
+        const auto& places = _journal._places;
+        const std::uint64_t from = std::max(_from, _continueAt);
+        const auto after = std::upper_bound(
+            places.begin(), places.end(), from,
+            [](std::uint64_t number, const Place& place) { return number < place.packet; });
+        if (_journal._canSeek && after != places.begin() && std::prev(after)->packet > 1) {
+            const Place& place = *std::prev(after);
+            if (_recording->seek(place.position)) {
+                _next = place.packet;
+                _expected = place;
+            }
+        }
+        _position = _recording->position().value_or(0);
+    }
+
+    /// The next packet, wanted or not.
+    std::optional<JournalPacket> readOne() {
+        const bool hasMore = _recording == nullptr && _continueAt != 0 && hasGrown();
+        if (hasMore) {
+            _from = std::max(_from, _continueAt);
+            start();
+        }
+        if (_recording == nullptr) {
+            return std::nullopt;
+        }
+        const auto packet = _recording->next();
+        if (!packet) {
+            stop();
+            return std::nullopt;
+        }
+        if (_expected &&
+            (packet->time != _expected->time || packet->data.size() != _expected->length)) {
+            _journal._hasChanged = true;
+            stop();
+            return std::nullopt;
+        }
+        _expected.reset();
+        const std::uint64_t number = _next++;
+        const std::uint64_t before = std::exchange(_position, _recording->position().value_or(0));
+        const std::uint64_t after = _position;
+        if (after > _journal._read) {
+            _journal._canSeek = _journal._canSeek &&
+                                (number == 1 || isPacketAlone(before, after, packet->data.size()));
+            _journal._read = after;
+            _journal.note({number, before, packet->time, packet->data.size()});
+        }
+        return JournalPacket{number, packet->time, packet->data};
+    }
+
+    void stop() {
+        if (const auto& error = _recording->error()) {
+            _journal._error = error->sentence;
+        }
+        _continueAt = _next;
+        _sizeAtEnd = sizeOf(_journal._path).value_or(0);
+        _recording.reset();
+    }
+    bool hasGrown() const {
+        return !_journal._hasChanged && sizeOf(_journal._path).value_or(0) > _sizeAtEnd;
+    }
+
+    RecordingJournal& _journal;
+    std::uint64_t _from;
+    std::unique_ptr<Recording> _recording; // null: at the end, or not readable
+    std::uint64_t _next = 1;
+    std::uint64_t _continueAt = 0; // after the end: the number of the packet that may follow
+    std::uint64_t _sizeAtEnd = 0;
+    std::uint64_t _position = 0;    // in the file, after the latest packet
+    std::optional<Place> _expected; // the packet after a seek
+};
+
+bool RecordingJournal::isSuitable(const std::string& path) {
+    return !RecordingFile::isStream(path) && regularFile(path).has_value();
+}
+
+Result<std::unique_ptr<RecordingJournal>, RecordingError>
+RecordingJournal::open(const std::string& path) {
+    const auto opened = Recording::open(path);
+    if (!opened) {
+        return opened.error();
+    }
+    std::unique_ptr<RecordingJournal> journal(new RecordingJournal(path));
+    journal->_identity = regularFile(path).value_or(FileIdentity());
+    journal->_size = sizeOf(path).value_or(0);
+    journal->_technology = (*opened)->technology();
+    return journal;
+}
+
+std::unique_ptr<PacketReader> RecordingJournal::reader(std::uint64_t from) {
+    return std::make_unique<Reader>(*this, from);
+}
+
+bool RecordingJournal::isSameFile() const {
+    return regularFile(_path) == _identity;
+}
+
+void RecordingJournal::note(const Place& place) {
+    if (place.packet % kPlacesEvery == 1) {
+        _places.push_back(place);
+    }
+}
+
+std::optional<std::string> RecordingJournal::trouble() const {
+    if (!isSameFile()) {
+        return formatText("%@ was replaced or removed while it was read.", {_path});
+    }
+    const std::uint64_t size = sizeOf(_path).value_or(0);
+    if (size < _size || size < _read) {
+        return formatText("%@ has become shorter while it was read.", {_path});
+    }
+    if (_hasChanged) {
+        return formatText("%@ was changed while it was read.", {_path});
+    }
+    if (size > _size) {
+        return formatText("%@ has grown while it was read.", {_path});
+    }
+    return _error;
+}
+
+double RecordingJournal::share() const {
+    return _size != 0 ? std::min(static_cast<double>(_read) / static_cast<double>(_size), 1.0)
+                      : 1.0;
+}
+
+} // namespace pallax

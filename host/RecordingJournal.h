@@ -1,0 +1,60 @@
+#pragma once
+
+#include "host/FileIdentity.h"
+#include "host/Recording.h"
+#include "packets/PacketJournal.h"
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace pallax {
+
+/// A recording in a regular file, which is its own journal: readers begin at places in the file
+/// that were noted when it was read first. What is done to the file meanwhile is told and ends the
+/// reading at worst.
+class RecordingJournal final : public PacketJournal {
+public:
+    /// Errors as for Recording. For a stream, and for a file that cannot be read from the middle,
+    /// use another journal (`isSuitable`).
+    static Result<std::unique_ptr<RecordingJournal>, RecordingError> open(const std::string& path);
+    /// Whether the recording can be opened again and read from the middle.
+    static bool isSuitable(const std::string& path);
+
+    const RecordedTechnology* technology() const { return _technology; }
+    std::unique_ptr<PacketReader> reader(std::uint64_t from) override;
+    /// That the file was replaced, changed, or became shorter or longer, or how it ends.
+    std::optional<std::string> trouble() const override;
+    /// The part of the file before the latest packet that was read for the first time, 0 to 1.
+    double share() const;
+
+private:
+    class Reader;
+
+    /// Where a packet begins, and what tells it from others.
+    struct Place {
+        std::uint64_t packet;
+        std::uint64_t position;
+        Time time;
+        std::size_t length;
+    };
+    static constexpr std::uint64_t kPlacesEvery = 4096; // packets
+
+    explicit RecordingJournal(std::string path) : _path(std::move(path)) {}
+    bool isSameFile() const;
+    void note(const Place& place);
+
+    std::string _path;
+    FileIdentity _identity;
+    std::uint64_t _size = 0; // when it was opened
+    const RecordedTechnology* _technology = nullptr;
+    std::vector<Place> _places;
+    std::uint64_t _read = 0; // the end of the packet that was read furthest
+    bool _canSeek = true;
+    bool _hasChanged = false;
+    std::optional<std::string> _error;
+};
+
+} // namespace pallax

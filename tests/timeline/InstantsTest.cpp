@@ -1,0 +1,164 @@
+#include "timeline/Instants.h"
+
+#include "decoding/RecordingDecoder.h"
+#include "tests/doubles/FakeStandardOutput.h"
+#include "tests/timeline/TimelineFixture.h"
+
+#include <string>
+
+namespace pallax {
+namespace {
+
+using namespace std::chrono_literals;
+namespace any = doubles::any;
+
+/// What `decode --every tick` shows.
+class ShownTicks final : public DisplayOutput {
+public:
+    struct Tick {
+        std::uint64_t number;
+        Time time;
+        std::string display;
+    };
+    std::vector<Tick> all;
+
+    void beginRecording() override {}
+    void show(const DisplayMoment& moment, const PropertyList& display) override {
+        all.push_back({moment.number, moment.time, treeText(display)});
+    }
+    static std::string treeText(const PropertyList& display) {
+        PathDictionary paths;
+        return treeText(PallaxModelNode::makeTreeFromObject(display, paths));
+    }
+    /// A line for each node, in display order.
+    static std::string treeText(const NodeRef& node, const std::string& path = "/") {
+        if (node == nullptr) {
+            return {};
+        }
+        const PropertyList* value = node->value();
+        std::string text =
+            path + " " + (value != nullptr ? value->string().value_or(value->description()) : "") +
+            "\n";
+        if (node->childNodes() != nullptr) {
+            for (const NodeRef& child : *node->childNodes()) {
+                text += treeText(child, childPath(path, child->displayName()));
+            }
+        }
+        return text;
+    }
+};
+
+ShownTicks decoded(const TimelineFixture& fixture) {
+    doubles::FakeStandardOutput output;
+    ShownTicks ticks;
+    RecordingDecoder decoder({fixture.resources, fixture.bundle, output, technologies()},
+                             fixture.technology.identifier, Every::Tick, ticks);
+    for (std::uint64_t number = 1; number <= fixture.journal.size(); ++number) {
+        const JournalPacket packet = fixture.journal.packet(number);
+        EXPECT_FALSE(decoder.add({packet.time, packet.data}));
+    }
+    decoder.finish();
+    return ticks;
+}
+
+std::string treeText(const Frame& frame) {
+    return ShownTicks::treeText(frame.root());
+}
+
+class InstantsTest : public testing::TestWithParam<const char*> {};
+
+TEST_P(InstantsTest, AFrameIsThatOfTheLatestTickAtOrBeforeTheTime) {
+    EXPECT_TRUE(doubles::holds([] {
+        TimelineFixture fixture(GetParam());
+        const auto seconds = any::between(1, 40);
+        fixture.drive(any::bits(), std::chrono::seconds(seconds), 10);
+        const ShownTicks shown = decoded(fixture);
+        const auto timeline = fixture.indexed(
+            TimelineFixture::closeKeyFrames(static_cast<std::uint64_t>(any::between(1, 60))));
+        const Time time = Simulation::kStart + any::between(0, seconds * 1000 + 3000) * 1ms;
+        std::size_t expected = 0;
+        while (expected < shown.all.size() && shown.all[expected].time <= time) {
+            ++expected;
+        }
+        const auto frame = frameAt(*timeline, time);
+        RC_ASSERT(frame.has_value() == (expected != 0));
+        if (!frame) {
+            return;
+        }
+        const ShownTicks::Tick& tick = shown.all[expected - 1];
+        RC_ASSERT(frame->tick.number == tick.number);
+        RC_ASSERT(frame->tick.time == tick.time);
+        RC_ASSERT(frame->frame->time() == tick.time);
+        RC_ASSERT(treeText(*frame->frame) == tick.display);
+        RC_ASSERT((frame->before != nullptr) == (expected > 1));
+        if (frame->before) {
+            RC_ASSERT(frame->before->time() == shown.all[expected - 2].time);
+            RC_ASSERT(treeText(*frame->before) == shown.all[expected - 2].display);
+        }
+    }));
+}
+
+TEST_P(InstantsTest, TicksAfterAClockThatStepsBackAreFound) {
+    TimelineFixture fixture(GetParam());
+    fixture.drive(2, 30s, 10);
+    MemoryJournal again;
+    const std::uint64_t first = fixture.journal.size();
+    for (std::uint64_t number = 1; number <= first; number += 2) {
+        const JournalPacket packet = fixture.journal.packet(number);
+        // Begins 50 s earlier and ends between the first stretch's begin and end.
+        again.add(packet.time - 50s + 25s * number / first,
+                  ByteBuffer(packet.data.begin(), packet.data.end()));
+    }
+    for (std::uint64_t number = 1; number <= again.size(); ++number) {
+        const JournalPacket packet = again.packet(number);
+        fixture.journal.add(packet.time, ByteBuffer(packet.data.begin(), packet.data.end()));
+    }
+    const ShownTicks shown = decoded(fixture);
+    const auto timeline = fixture.indexed(TimelineFixture::closeKeyFrames(30));
+    ASSERT_EQ(timeline->stretches().size(), 2U);
+    const Time start = timeline->stretches()[0].first;
+    std::size_t inSecond = 0;
+    for (std::size_t index = 0; index < shown.all.size(); ++index) {
+        const ShownTicks::Tick& tick = shown.all[index];
+        const bool isSecond = index > 0 && (inSecond > 0 || tick.time < shown.all[index - 1].time);
+        inSecond += isSecond ? 1 : 0;
+        if (isSecond && tick.time >= start) {
+            continue; // the first stretch has that time, too
+        }
+        const auto frame = frameAt(*timeline, tick.time + 1ms);
+        ASSERT_TRUE(frame);
+        EXPECT_EQ(frame->tick.number, tick.number);
+        EXPECT_EQ(frame->tick.time, tick.time);
+        EXPECT_EQ(treeText(*frame->frame), tick.display);
+    }
+    EXPECT_GT(inSecond, 5U);
+}
+
+INSTANTIATE_TEST_SUITE_P(Technologies, InstantsTest, testing::ValuesIn(technologyNames()),
+                         [](const auto& each) { return std::string(each.param); });
+
+TEST(Instants, AFrameTellsWhatChangedSinceTheTickBefore) {
+    TimelineFixture fixture("lte");
+    const Time start = Simulation::kStart;
+    const auto cell = [&](int second, std::uint16_t pci) {
+        fixture.journal.add(start + std::chrono::seconds(second),
+                            doubles::Record(0xB0C2).padTo(14).u16(pci).padTo(38).bytes());
+    };
+    cell(0, 150);
+    cell(3, 182);
+    cell(5, 182);
+    const auto timeline = fixture.indexed(TimelineFixture::closeKeyFrames(1));
+    const auto frame = frameAt(*timeline, start + 4s);
+    ASSERT_TRUE(frame && frame->before);
+    EXPECT_EQ(frame->frame->changed(),
+              std::vector<std::string>{"/Serving Cell Info/Physical Cell ID"});
+    EXPECT_EQ(frame->frame->age(*frame->frame->nodeAtPath("/Serving Cell Info/Cell Identity")), 1s);
+    const auto last = frameAt(*timeline, start + 100s);
+    ASSERT_TRUE(last);
+    EXPECT_TRUE(last->frame->changed().empty());
+    EXPECT_FALSE(frameAt(*timeline, start + 1s)) << "no tick has passed";
+    EXPECT_FALSE(frameAt(*timeline, start - 1s));
+}
+
+} // namespace
+} // namespace pallax
