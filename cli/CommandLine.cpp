@@ -95,6 +95,7 @@ CommandLine::CommandLine()
     addExplain(addCommand("explain", "Explain a channel, a network code, a field or a value"),
                _explain);
     addInfo(addCommand("info", "Tell what recordings hold"), _info);
+    addSql(addCommand("sql", "Ask a recording in SQL"), _sql);
     addTexts();
 }
 
@@ -207,6 +208,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("info")) {
         return _info;
+    }
+    if (_app->got_subcommand("sql")) {
+        return _sql;
     }
     return _browse;
 }

@@ -40,6 +40,7 @@ private:
     EventsOptions _events;
     FieldsOptions _fields;
     InfoOptions _info;
+    SqlOptions _sql;
     RecordOptions _record;
     ServiceRequest _service;
     SimulateOptions _simulate;

@@ -1,6 +1,8 @@
 #include "cli/InspectOptions.h"
 
+#include "cli/OptionParts.h"
 #include "decoding/InfoCommand.h"
+#include "querying/SqlCommand.h"
 
 #include <CLI/CLI.hpp>
 
@@ -31,6 +33,43 @@ Exit status:
   1   failure: cannot read a file or template, or write the output
   2   wrong usage)";
 
+constexpr const char* kSqlFooter = R"(Examples:
+  pallax sql drive.pcap 'select time_text(time), words from event'
+  pallax sql drive.pcap 'select physical_cell_id, avg(measured_rsrp)
+      from serving_cell_measurements group by 1'
+  pallax sql drive.pcap --format csv --file worst-cells.sql > worst.csv
+
+The query is one statement of SQL, as SQLite has it, that only reads. "time" is
+UTC in microseconds. The tables:
+
+  packet   a row for each packet: time, packet, length, code
+  sample   each value that was read: time, packet, field, entry, raw, number,
+           text, unit
+  span     each time that a field held a value: start, packet, field, entry,
+           hold (microseconds), number, text, unit
+  state    each display tick: time, packet, tick, a column for each field that
+           is in no list, and hidden columns NAME_age in seconds
+  event    what happened: time, packet, kind, words, fields
+  field    the fields, as in "pallax fields"
+
+and a table for each section and each list in it, with a row for each reading
+(of a list, each entry, with its identity and its place): the name of a field
+(lte.serving_cell_measurements.measured_rsrp) is technology, table and column.
+
+The functions band(technology, channel), mhz(technology, channel),
+operator(mcc, mnc), cell_site(technology, identity), quality(field, value) or
+quality(field, value, profile), time_text(time) and the aggregate
+quantile(value, weight, q) are there beside those of SQLite.
+
+Several recordings are one, in the order of their times. A column of numbers is
+NULL where the display has a text instead ("Not Present").
+
+Exit status:
+  0   success, or the reader of the output has gone
+  1   failure: cannot read a recording or template, or write the output; the
+      recording is damaged or the query was stopped
+  2   wrong usage: an unknown option, or a query that is wrong)";
+
 } // namespace
 
 void addInfo(CLI::App& app, InfoOptions& options) {
@@ -39,6 +78,21 @@ void addInfo(CLI::App& app, InfoOptions& options) {
         ->required()
         ->type_name("");
     app.footer(kInfoFooter);
+}
+
+void addSql(CLI::App& app, SqlOptions& options) {
+    addTechnology(app, "--technology", options.technology,
+                  "The technology of the recordings (default: from their link type)");
+    addChoice<RowFormat>(
+        app, "--format", options.format,
+        {{"table", RowFormat::Table}, {"csv", RowFormat::Csv}, {"json", RowFormat::Json}},
+        "A table, CSV, or JSON, one object per row (default: table)");
+    app.add_option("--file", options.file, "Read the query from this file")->type_name("FILE");
+    app.add_option("RECORDING... QUERY", options.words,
+                   "Recordings (pcap or pcapng), and the query unless it is in a file")
+        ->required()
+        ->type_name("");
+    app.footer(kSqlFooter);
 }
 
 } // namespace pallax

@@ -7,8 +7,10 @@ class App;
 namespace pallax {
 
 struct InfoOptions;
+struct SqlOptions;
 
-/// The options of the commands that describe files. They must outlive the app.
+/// The options of the commands that look into files. They must outlive the app.
 void addInfo(CLI::App& app, InfoOptions& options);
+void addSql(CLI::App& app, SqlOptions& options);
 
 } // namespace pallax

@@ -7,6 +7,7 @@
 #include "decoding/FieldsCommand.h"
 #include "decoding/InfoCommand.h"
 #include "explaining/ExplainCommand.h"
+#include "querying/SqlCommand.h"
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
 #include "telephony/Service.h"
@@ -30,9 +31,10 @@ struct ParseEnd {
 /// `pallax service --status`.
 struct ServiceStatusOptions {};
 
-using ParsedOptions = std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions,
-                                   ServiceStatusOptions, SimulateOptions, EventsOptions,
-                                   FieldsOptions, ExplainOptions, InfoOptions, ParseEnd>;
+using ParsedOptions =
+    std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
+                 SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions, InfoOptions,
+                 SqlOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

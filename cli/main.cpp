@@ -34,6 +34,7 @@ struct Run {
     ExitStatus operator()(const FieldsOptions& options) const { return runFields(options); }
     ExitStatus operator()(const ExplainOptions& options) const { return runExplain(options); }
     ExitStatus operator()(const InfoOptions& options) const { return runInfo(options); }
+    ExitStatus operator()(const SqlOptions& options) const { return runSql(options); }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);

@@ -1,6 +1,6 @@
 #include "decoding/DisplayOutput.h"
 
-#include "text/Printable.h"
+#include "text/Csv.h"
 
 #include <cmath>
 
@@ -10,22 +10,6 @@ namespace {
 
 constexpr std::string_view kHeader = "time,path,value,number,unit\n";
 constexpr std::string_view kNoCells = ",,";
-
-void appendCell(std::string& out, std::string_view text) {
-    if (text.find_first_of("\",\r\n") == std::string_view::npos) {
-        appendValidUtf8(out, text);
-        return;
-    }
-    std::string quoted = "\"";
-    for (const char character : text) {
-        quoted += character;
-        if (character == '"') {
-            quoted += '"';
-        }
-    }
-    quoted += '"';
-    appendValidUtf8(out, quoted);
-}
 
 std::string textOf(const PropertyList& value) {
     std::string text;
@@ -40,12 +24,12 @@ std::string textOf(const PropertyList& value) {
 std::string cellsOf(const PropertyList& value) {
     const std::string text = textOf(value);
     std::string cells;
-    appendCell(cells, text);
+    appendCsvCell(cells, text);
     cells += ',';
     if (const DisplayNumber* number = value.displayNumber()) {
         appendBareNumber(cells, *number);
         cells += ',';
-        appendCell(cells, number->unit());
+        appendCsvCell(cells, number->unit());
         return cells;
     }
     if (value.integer() || std::isfinite(value.real().value_or(NAN))) {
@@ -84,7 +68,7 @@ CsvOutput::CsvOutput(Output& output, bool withHeader, Names names)
 void CsvOutput::nameRecording(std::string_view name) {
     if (_names == Names::Column) {
         _name.clear();
-        appendCell(_name, name);
+        appendCsvCell(_name, name);
         _name += ',';
     }
 }
@@ -111,7 +95,7 @@ void CsvOutput::removed(std::string_view path, DisplayDifference::Leaf& /*leaf*/
 void CsvOutput::writeRow(std::string_view path, std::string_view cells) {
     std::string& text = _output.text();
     text += _start;
-    appendCell(text, path);
+    appendCsvCell(text, path);
     text += ',';
     text += cells;
     text += '\n';

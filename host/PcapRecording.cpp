@@ -62,7 +62,7 @@ public:
     std::optional<RecordedPacket> next() override;
     std::optional<std::uint64_t> position() const override;
     bool seek(std::uint64_t position) override {
-        return !_isStream &&
+        return !_file.isStream && !_file.compressed &&
                ::fseeko(pcap_file(_capture), static_cast<off_t>(position), SEEK_SET) == 0;
     }
     const std::optional<RecordingError>& error() const override { return _error; }

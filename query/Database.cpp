@@ -52,26 +52,49 @@ QueryError errorOf(sqlite3& connection) {
             place >= 0 ? std::optional(static_cast<std::size_t>(place)) : std::nullopt};
 }
 
-void run(sqlite3& connection, const std::string& text) {
-    if (sqlite3_exec(&connection, text.c_str(), nullptr, nullptr, nullptr) != SQLITE_OK) {
-        throw std::runtime_error(sqlite3_errmsg(&connection));
-    }
-}
-
-QueryValue valueOf(sqlite3_stmt& statement, int column) {
-    switch (sqlite3_column_type(&statement, column)) {
+QueryValue valueOf(sqlite3_value* value) {
+    switch (sqlite3_value_type(value)) {
     case SQLITE_INTEGER:
-        return std::int64_t{sqlite3_column_int64(&statement, column)};
+        return std::int64_t{sqlite3_value_int64(value)};
     case SQLITE_FLOAT:
-        return sqlite3_column_double(&statement, column);
+        return sqlite3_value_double(value);
     case SQLITE_NULL:
         return {};
     default: {
-        const auto* text = static_cast<const char*>(sqlite3_column_blob(&statement, column));
-        const int length = sqlite3_column_bytes(&statement, column);
-        return text != nullptr ? std::string(text, static_cast<std::size_t>(length))
-                               : std::string();
+        const auto* text = static_cast<const char*>(sqlite3_value_blob(value));
+        const auto length = static_cast<std::size_t>(sqlite3_value_bytes(value));
+        return text != nullptr ? std::string(text, length) : std::string();
     }
+    }
+}
+
+void giveTo(sqlite3_context& context, const QueryValue& value) {
+    ColumnValue result(context);
+    if (const auto* number = std::get_if<std::int64_t>(&value)) {
+        result.integer(*number);
+    } else if (const auto* real = std::get_if<double>(&value)) {
+        result.real(*real);
+    } else if (const auto* text = std::get_if<std::string>(&value)) {
+        result.text(*text);
+    }
+}
+
+void call(sqlite3_context* context, int count, sqlite3_value** arguments) {
+    const auto& function = *static_cast<Database::Function*>(sqlite3_user_data(context));
+    std::vector<QueryValue> values;
+    for (int index = 0; index < count; ++index) {
+        values.push_back(valueOf(arguments[index]));
+    }
+    try {
+        giveTo(*context, function(values));
+    } catch (const std::exception& error) {
+        sqlite3_result_error(context, error.what(), -1);
+    }
+}
+
+void run(sqlite3& connection, const std::string& text) {
+    if (sqlite3_exec(&connection, text.c_str(), nullptr, nullptr, nullptr) != SQLITE_OK) {
+        throw std::runtime_error(sqlite3_errmsg(&connection));
     }
 }
 
@@ -101,7 +124,7 @@ Result<std::optional<std::vector<QueryValue>>, QueryError> Query::next() {
     std::vector<QueryValue> row;
     row.reserve(_columns.size());
     for (std::size_t column = 0; column < _columns.size(); ++column) {
-        row.push_back(valueOf(*_statement, static_cast<int>(column)));
+        row.push_back(valueOf(sqlite3_column_value(_statement.get(), static_cast<int>(column))));
     }
     return Row(std::move(row));
 }
@@ -135,12 +158,26 @@ void Database::add(const std::string& schema, const std::string& name,
         run(*_connection, "ATTACH ':memory:' AS \"" + schema + "\"");
         _schemas.push_back(schema);
     }
+    _names.push_back(name);
+    for (const Column& column : table->columns()) {
+        _names.push_back(column.name);
+    }
     _tables.push_back(std::move(table));
     _added.push_back(std::make_unique<AddedTable>(AddedTable{*_tables.back(), _isDeclaring}));
     const std::string qualified = "\"" + schema + "\".\"" + name + "\"";
     if (!addVirtualTable(*_connection, qualified.c_str(), *_added.back())) {
         throw std::runtime_error(sqlite3_errmsg(_connection.get()));
     }
+}
+
+void Database::addFunction(const char* name, int arguments, Function function) {
+    _functions.push_back(std::make_unique<Function>(std::move(function)));
+    if (sqlite3_create_function_v2(_connection.get(), name, arguments,
+                                   SQLITE_UTF8 | SQLITE_DETERMINISTIC, _functions.back().get(),
+                                   call, nullptr, nullptr, nullptr) != SQLITE_OK) {
+        throw std::runtime_error(sqlite3_errmsg(_connection.get()));
+    }
+    _names.emplace_back(name);
 }
 
 void Database::setMayContinue(std::function<bool()> mayContinue) {

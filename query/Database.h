@@ -7,6 +7,7 @@
 #include <functional>
 #include <memory>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <variant>
@@ -62,6 +63,14 @@ public:
     /// Adds a table under `schema`.`name`; "main" is the schema that is always there. Throws
     /// std::runtime_error if there is such a table.
     void add(const std::string& schema, const std::string& name, std::unique_ptr<QueryTable> table);
+    /// Computes a value from the arguments of a call. A std::exception that it throws is the error
+    /// of the query.
+    using Function = std::function<QueryValue(std::span<const QueryValue> arguments)>;
+    /// Adds a function of that many arguments; -1 for any number. Its value must depend on nothing
+    /// but them.
+    void addFunction(const char* name, int arguments, Function function);
+    /// The names of all tables and their columns, for suggestions.
+    const std::vector<std::string>& names() const { return _names; }
     /// Asked every few thousand steps of a query; false stops it.
     void setMayContinue(std::function<bool()> mayContinue);
 
@@ -76,6 +85,8 @@ private:
     // These outlive the connection.
     std::vector<std::unique_ptr<QueryTable>> _tables;
     std::vector<std::unique_ptr<AddedTable>> _added;
+    std::vector<std::unique_ptr<Function>> _functions;
+    std::vector<std::string> _names;
     bool _isDeclaring = false;
 
     std::unique_ptr<sqlite3, Close> _connection;

@@ -10,8 +10,8 @@ namespace {
 
 const std::vector<Column>& packetColumns() {
     static const std::vector<Column> columns = {
-        {"time", "INTEGER", Column::Role::Time},
-        {"packet", "INTEGER", Column::Role::Packet},
+        {"time", "INTEGER", Column::Role::TimeStamp},
+        {"packet", "INTEGER", Column::Role::PacketNumber},
         {"length", "INTEGER"},
         {"code", "INTEGER"},
     };

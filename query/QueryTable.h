@@ -16,15 +16,15 @@ namespace pallax {
 /// A column, and what a condition on it says about the rows that are needed.
 struct Column {
     enum class Role {
-        Value,  ///< nothing
-        Time,   ///< UTC in microseconds: where in the recording they are
-        Packet, ///< likewise, by the packet's number
-        Field,  ///< of which field they tell, by its name
+        Plain,        ///< nothing
+        TimeStamp,    ///< UTC in microseconds: where in the recording they are
+        PacketNumber, ///< likewise, by the packet's number
+        FieldName,    ///< of which field they tell, by its name
     };
 
     std::string name;
     std::string_view type; ///< of SQL; empty if values of any type come
-    Role role = Role::Value;
+    Role role = Role::Plain;
     bool isHidden = false; ///< given only where a query names it
 };
 

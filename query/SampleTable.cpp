@@ -10,9 +10,9 @@ namespace {
 
 const std::vector<Column>& sampleColumns() {
     static const std::vector<Column> columns = {
-        {"time", "INTEGER", Column::Role::Time},
-        {"packet", "INTEGER", Column::Role::Packet},
-        {"field", "TEXT", Column::Role::Field},
+        {"time", "INTEGER", Column::Role::TimeStamp},
+        {"packet", "INTEGER", Column::Role::PacketNumber},
+        {"field", "TEXT", Column::Role::FieldName},
         {"entry", "TEXT"},
         {"raw", "INTEGER"},
         {"number", "REAL"},

@@ -107,10 +107,10 @@ public:
     SectionTable(Timeline& timeline, FieldGroup group)
         : _timeline(timeline),
           _group(std::move(group)), _columns{
-                                        {"time", "INTEGER", Column::Role::Time},
-                                        {"packet", "INTEGER", Column::Role::Packet},
-                                        {"entry", "TEXT", Column::Role::Value, !_group.isList},
-                                        {"place", "INTEGER", Column::Role::Value, !_group.isList}} {
+                                        {"time", "INTEGER", Column::Role::TimeStamp},
+                                        {"packet", "INTEGER", Column::Role::PacketNumber},
+                                        {"entry", "TEXT", Column::Role::Plain, !_group.isList},
+                                        {"place", "INTEGER", Column::Role::Plain, !_group.isList}} {
         for (const auto& [field, name] : _group.fields) {
             _columnOf.resize(std::max<std::size_t>(_columnOf.size(), field + 1),
                              SectionRows::kNone);

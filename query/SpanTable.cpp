@@ -11,7 +11,7 @@ namespace {
 
 const std::vector<Column>& spanColumns() {
     static const std::vector<Column> columns = {
-        {"start", "INTEGER"}, {"packet", "INTEGER"}, {"field", "TEXT", Column::Role::Field},
+        {"start", "INTEGER"}, {"packet", "INTEGER"}, {"field", "TEXT", Column::Role::FieldName},
         {"entry", "TEXT"},    {"hold", "INTEGER"},   {"number", "REAL"},
         {"text", "TEXT"},     {"unit", "TEXT"},
     };

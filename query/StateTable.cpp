@@ -112,8 +112,8 @@ private:
 class StateTable final : public QueryTable {
 public:
     explicit StateTable(Timeline& timeline)
-        : _timeline(timeline), _columns{{"time", "INTEGER", Column::Role::Time},
-                                        {"packet", "INTEGER", Column::Role::Packet},
+        : _timeline(timeline), _columns{{"time", "INTEGER", Column::Role::TimeStamp},
+                                        {"packet", "INTEGER", Column::Role::PacketNumber},
                                         {"tick", "INTEGER"}} {
         const FieldTable& fields = timeline.fields();
         std::map<std::string, int> uses;
@@ -133,7 +133,7 @@ public:
             _columns.push_back({names.back(), ""});
         }
         for (const std::string& name : names) {
-            _columns.push_back({name + "_age", "REAL", Column::Role::Value, true});
+            _columns.push_back({name + "_age", "REAL", Column::Role::Plain, true});
         }
     }
 

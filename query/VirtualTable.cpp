@@ -78,13 +78,13 @@ int disconnect(sqlite3_vtab* table) {
 
 char letterOf(Column::Role role) {
     switch (role) {
-    case Column::Role::Time:
+    case Column::Role::TimeStamp:
         return 't';
-    case Column::Role::Packet:
+    case Column::Role::PacketNumber:
         return 'p';
-    case Column::Role::Field:
+    case Column::Role::FieldName:
         return 'f';
-    case Column::Role::Value:
+    case Column::Role::Plain:
         break;
     }
     return '\0';

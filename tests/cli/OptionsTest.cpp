@@ -309,7 +309,7 @@ TEST(Options, EventsAreOfRecordings) {
 
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
     for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "events",
-                                "fields", "explain", "info", "completion", "manual"}) {
+                                "fields", "explain", "info", "sql", "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);

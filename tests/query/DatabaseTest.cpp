@@ -10,9 +10,10 @@ public:
     explicit Numbers(int& given) : _given(given) {}
 
     const std::vector<Column>& columns() const override {
-        static const std::vector<Column> columns = {{"number", "INTEGER", Column::Role::Packet},
-                                                    {"name", "TEXT"},
-                                                    {"secret", "TEXT", Column::Role::Value, true}};
+        static const std::vector<Column> columns = {
+            {"number", "INTEGER", Column::Role::PacketNumber},
+            {"name", "TEXT"},
+            {"secret", "TEXT", Column::Role::Plain, true}};
         return columns;
     }
     std::unique_ptr<Rows> rows(const RowBounds& bounds) override {

@@ -1,0 +1,111 @@
+#include "querying/RecordedTimeline.h"
+
+#include "decoding/JoinedRecording.h"
+#include "host/BoundedJournal.h"
+#include "host/RecordingJournal.h"
+#include "text/Format.h"
+
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+struct OpenJournal {
+    std::unique_ptr<PacketJournal> journal;
+    const RecordedTechnology* technology = nullptr; ///< of the link type; null if it is unknown
+    std::optional<RecordingError> foreign = {};     ///< the error for an unknown link type
+    std::vector<std::string> notes = {};
+};
+using OpenResult = Result<OpenJournal, RecordingError>;
+
+Recording::OpenResult openRecordings(const std::vector<std::string>& paths) {
+    return paths.size() == 1 ? Recording::open(paths.front())
+                             : JoinedRecording::open(paths, Recording::open);
+}
+
+OpenResult openFile(const std::string& path) {
+    const auto recording = Recording::open(path);
+    if (!recording) {
+        return recording.error();
+    }
+    OpenJournal opened{nullptr, (*recording)->technology()};
+    if (opened.technology == nullptr) {
+        opened.foreign = (*recording)->foreignLinkType();
+    }
+    auto journal = RecordingJournal::open(path);
+    if (!journal) {
+        return journal.error();
+    }
+    opened.journal = std::move(journal).value();
+    return opened;
+}
+
+/// Reads a source that cannot be read again, or not in one piece.
+OpenResult keep(const std::vector<std::string>& paths, const MayContinue& mayContinue) {
+    const auto recording = openRecordings(paths);
+    if (!recording) {
+        return recording.error();
+    }
+    auto journal = std::make_unique<BoundedJournal>(BoundedJournal::stateFolder());
+    while (const auto packet = (*recording)->next()) {
+        journal->add(packet->time, packet->data);
+        if (mayContinue && !mayContinue()) {
+            break;
+        }
+    }
+    OpenJournal opened{nullptr, (*recording)->technology()};
+    if (opened.technology == nullptr) {
+        opened.foreign = (*recording)->foreignLinkType();
+    }
+    if (const auto& error = (*recording)->error()) {
+        opened.notes.push_back(error->sentence);
+    }
+    if (journal->first() > 1) {
+        opened.notes.push_back(formatText("%@: only the packets from %llu on were kept.",
+                                          {(*recording)->name(), journal->first()}));
+    }
+    opened.journal = std::move(journal);
+    return opened;
+}
+
+} // namespace
+
+Result<std::unique_ptr<RecordedTimeline>, RecordingError>
+RecordedTimeline::open(const Request& request, const DecoderEnvironment& environment) {
+    const bool isFile =
+        request.recordings.size() == 1 && RecordingJournal::isSuitable(request.recordings.front());
+    auto opened = isFile ? openFile(request.recordings.front())
+                         : keep(request.recordings, request.mayContinue);
+    if (!opened) {
+        return opened.error();
+    }
+    OpenJournal journal = std::move(opened).value();
+    const RecordedTechnology* technology =
+        request.technology != nullptr ? request.technology : journal.technology;
+    if (technology == nullptr) {
+        return *journal.foreign;
+    }
+    std::unique_ptr<RecordedTimeline> made(new RecordedTimeline);
+    made->_journal = std::move(journal.journal);
+    made->_notes = std::move(journal.notes);
+    made->_timeline = std::make_unique<Timeline>(
+        *made->_journal, DecodingSource{*technology, environment.resources, environment.bundle,
+                                        environment.technologies});
+    (void)made->_timeline->index(request.mayContinue);
+    return made;
+}
+
+std::vector<std::string> RecordedTimeline::notes() const {
+    std::vector<std::string> notes = _notes;
+    for (std::string& note : _timeline->notes()) {
+        notes.push_back(std::move(note));
+    }
+    if (_timeline->hasEnded()) {
+        const Event& fatal = _timeline->events().back();
+        notes.push_back(formatText("Packet %llu cannot be read: %@", {fatal.packet, fatal.words}));
+    }
+    return notes;
+}
+
+} // namespace pallax

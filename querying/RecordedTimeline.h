@@ -1,0 +1,42 @@
+#pragma once
+
+#include "decoding/RecordingDecoder.h"
+#include "host/Recording.h"
+#include "packets/PacketJournal.h"
+#include "text/Result.h"
+#include "timeline/Timeline.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace pallax {
+
+/// A recording, or several as one, that can be asked about any instant.
+class RecordedTimeline {
+public:
+    struct Request {
+        std::vector<std::string>
+            recordings; ///< not empty; several are one, in order of their times
+        const RecordedTechnology* technology = nullptr; ///< overrides the link type
+        MayContinue mayContinue = {};
+    };
+
+    /// Opens the recordings and reads them once. A file is read again where it is needed; of a
+    /// stream, and of several recordings, the latest packets are kept.
+    static Result<std::unique_ptr<RecordedTimeline>, RecordingError>
+    open(const Request& request, const DecoderEnvironment& environment);
+
+    Timeline& timeline() { return *_timeline; }
+    /// Sentences about what is missing or damaged; empty if all is well.
+    std::vector<std::string> notes() const;
+
+private:
+    RecordedTimeline() = default;
+
+    std::unique_ptr<PacketJournal> _journal; // outlives the timeline
+    std::unique_ptr<Timeline> _timeline;
+    std::vector<std::string> _notes;
+};
+
+} // namespace pallax

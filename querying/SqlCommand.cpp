@@ -1,0 +1,142 @@
+#include "querying/SqlCommand.h"
+
+#include "LogGenerator/Technologies/Technologies.h"
+#include "console/Output.h"
+#include "decoding/DroppedNotices.h"
+#include "decoding/RequiredTemplates.h"
+#include "host/BuildBundle.h"
+#include "host/Complaint.h"
+#include "host/KnowledgeFiles.h"
+#include "host/UserFolders.h"
+#include "knowledge/Networks.h"
+#include "query/Functions.h"
+#include "query/TimelineTables.h"
+#include "querying/RecordedTimeline.h"
+#include "text/Format.h"
+#include "text/Suggestion.h"
+
+#include <algorithm>
+#include <fstream>
+#include <iterator>
+#include <unistd.h>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+struct Question {
+    std::vector<std::string> recordings;
+    std::string query;
+};
+
+/// The wrong usage, as a sentence, or the question.
+Result<Question, std::string> questionOf(const SqlOptions& options) {
+    Question question{options.words, {}};
+    if (options.file) {
+        std::ifstream file(*options.file, std::ios::binary);
+        question.query.assign(std::istreambuf_iterator<char>(file), {});
+        if (!file) {
+            return formatText("%@ cannot be read.", {*options.file});
+        }
+    } else if (!question.recordings.empty()) {
+        question.query = std::move(question.recordings.back());
+        question.recordings.pop_back();
+    }
+    if (question.recordings.empty()) {
+        return std::string("sql takes recordings and then a query (see pallax sql --help)");
+    }
+    return question;
+}
+
+/// Names of networks and profiles of this machine.
+QueryKnowledge knowledge() {
+    auto names = std::make_shared<std::optional<NetworkNames>>();
+    return {[names]() -> const NetworkNames* {
+                if (!*names) {
+                    InstalledNames installed = readInstalledNames(dataFolders());
+                    for (const std::string& complaint : installed.complaints) {
+                        complain(complaint);
+                    }
+                    *names = std::move(installed.names);
+                }
+                return &**names;
+            },
+            [](std::string_view name) -> std::optional<QualityProfile> {
+                auto profile = loadProfile(name, profileFolder());
+                return profile ? std::optional(std::move(profile).value()) : std::nullopt;
+            }};
+}
+
+ExitStatus writeRows(Query& query, RowFormat format) {
+    Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
+    RowWriter writer(format, query.columns(), output);
+    while (true) {
+        auto row = query.next();
+        if (!row) {
+            writer.finish();
+            complain(row.error().sentence);
+            return kExitFailure;
+        }
+        std::optional<std::vector<QueryValue>> values = std::move(row).value();
+        if (!values) {
+            writer.finish();
+            return kExitSuccess;
+        }
+        writer.write(*std::move(values));
+    }
+}
+
+} // namespace
+
+std::string queryErrorText(const QueryError& error, const std::string& query,
+                           const std::vector<std::string>& names) {
+    std::string text = error.sentence;
+    const std::size_t colon = text.rfind(": ");
+    if (colon != std::string::npos && text.starts_with("no such")) {
+        const std::string name = text.substr(colon + 2);
+        text += suggestion(name.substr(name.rfind('.') + 1), names);
+    }
+    if (error.place && *error.place <= query.size()) {
+        const std::string before = query.substr(0, *error.place);
+        const auto line = std::count(before.begin(), before.end(), '\n') + 1;
+        const std::size_t column = before.size() - (before.rfind('\n') + 1) + 1;
+        text += formatText(" (line %lld, column %zu of the query)", {line, column});
+    }
+    return text;
+}
+
+ExitStatus runSql(const SqlOptions& options) {
+    const auto question = questionOf(options);
+    if (!question) {
+        complain(question.error());
+        return kExitWrongUsage;
+    }
+    const RequiredTemplates resources(DirectoryResources::programFolder());
+    const BuildBundle bundle;
+    DroppedNotices notices;
+    const DecoderEnvironment environment{resources, bundle, notices, technologies()};
+    const auto recorded =
+        RecordedTimeline::open({question->recordings, options.technology, {}}, environment);
+    if (!recorded) {
+        complain(recorded.error().sentence);
+        return kExitFailure;
+    }
+    Database database;
+    addTimelineTables(database, (*recorded)->timeline());
+    addFunctions(database, knowledge());
+    auto query = database.prepare(question->query);
+    if (!query) {
+        complain(queryErrorText(query.error(), question->query, database.names()));
+        return kExitWrongUsage;
+    }
+    auto running = std::move(query).value();
+    const ExitStatus status = writeRows(running, options.format);
+    const std::vector<std::string> notes = (*recorded)->notes();
+    for (const std::string& note : notes) {
+        complain(note);
+    }
+    return notes.empty() ? status : std::max<ExitStatus>(status, kExitFailure);
+}
+
+} // namespace pallax
