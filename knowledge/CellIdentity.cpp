@@ -35,6 +35,18 @@ std::optional<UmtsCell> umtsCell(std::uint32_t identity) {
     return UmtsCell{identity >> kCellBits, lowBits(identity, kCellBits)};
 }
 
+std::string cellSiteText(RadioSystem system, std::uint32_t identity) {
+    const auto pair = [](std::uint32_t site, std::uint32_t cell) {
+        return std::to_string(site) + "-" + std::to_string(cell);
+    };
+    const auto lte = lteCell(identity);
+    const auto umts = umtsCell(identity);
+    if (system == RadioSystem::Lte && lte) {
+        return pair(lte->eNodeB, lte->sector);
+    }
+    return system == RadioSystem::UmtsFdd && umts ? pair(umts->rnc, umts->cell) : "";
+}
+
 std::optional<ColourCodes> colourCodesOf(std::uint32_t bsic) {
     constexpr unsigned kBsicBits = 6;
     constexpr unsigned kColourBits = 3;

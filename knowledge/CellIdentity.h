@@ -4,6 +4,7 @@
 
 #include <cstdint>
 #include <optional>
+#include <string>
 
 namespace pallax {
 
@@ -24,6 +25,10 @@ struct UmtsCell {
     friend bool operator==(const UmtsCell&, const UmtsCell&) = default;
 };
 std::optional<UmtsCell> umtsCell(std::uint32_t identity);
+
+/// "104465-1" for a cell of LTE (eNodeB and sector), "408-4353" for one of UMTS (RNC and cell);
+/// empty for other systems and for an identity of more than 28 bits.
+std::string cellSiteText(RadioSystem system, std::uint32_t identity);
 
 /// Base station identity code of 6 bits: network colour code, base station colour code.
 struct ColourCodes {

@@ -196,6 +196,7 @@ std::vector<Carrier> nrCarriersAt(Hertz hertz) {
 
 std::vector<BandPart> nrBands() {
     std::vector<BandPart> parts;
+    parts.reserve(kBands.size());
     for (const NrBand& band : kBands) {
         parts.push_back({band.name, channelsIn(band.downlink), channelsIn(band.uplink)});
     }

@@ -81,7 +81,8 @@ TEST_F(KnowledgeFiles, AProfileIsTheProgramsOrTheUsers) {
 TEST_F(KnowledgeFiles, AnUnknownProfileIsToldWithTheKnownOnes) {
     write("profiles/mine.conf", "");
     write("profiles/notes.txt", "");
-    for (const char* name : {"mimes", "", "../mine", "/etc/passwd"}) {
+    write("outside.conf", "rsrp = good -90\n");
+    for (const char* name : {"mimes", "", "../outside", "/etc/passwd"}) {
         const auto profile = loadProfile(name, folder.path("profiles"));
         ASSERT_FALSE(profile) << name;
         EXPECT_TRUE(profile.error().isUnknown);

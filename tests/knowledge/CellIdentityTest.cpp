@@ -27,6 +27,14 @@ TEST(CellIdentity, OfUmtsIsAControllerAndItsCell) {
     EXPECT_EQ(umtsCell(kMostIdentity + 1), std::nullopt);
 }
 
+TEST(CellIdentity, HasAShortText) {
+    EXPECT_EQ(cellSiteText(RadioSystem::Lte, 26743041), "104465-1");
+    EXPECT_EQ(cellSiteText(RadioSystem::UmtsFdd, 26743041), "408-4353");
+    EXPECT_EQ(cellSiteText(RadioSystem::Gsm, 1), "");
+    EXPECT_EQ(cellSiteText(RadioSystem::Lte, kMostIdentity + 1), "");
+    EXPECT_EQ(cellSiteText(RadioSystem::UmtsFdd, kMostIdentity + 1), "");
+}
+
 TEST(CellIdentity, OfABaseStationIsTwoColourCodes) {
     EXPECT_EQ(colourCodesOf(36), (ColourCodes{4, 4}));
     EXPECT_EQ(colourCodesOf(7), (ColourCodes{0, 7}));
