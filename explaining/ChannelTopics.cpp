@@ -33,13 +33,16 @@ const SystemWords& wordsOf(RadioSystem system) {
 
 constexpr double kHertzPerMegahertz = 1e6;
 
+PropertyList megahertzNumber(Hertz hertz) {
+    return PropertyList::real(static_cast<double>(hertz) / kHertzPerMegahertz);
+}
+
 PropertyList channelObject(const std::optional<Channel>& channel) {
     if (!channel) {
         return {};
     }
-    return Dictionary{
-        {"channel", PropertyList::integer(channel->number)},
-        {"mhz", PropertyList::real(static_cast<double>(channel->hertz) / kHertzPerMegahertz)}};
+    return Dictionary{{"channel", PropertyList::integer(channel->number)},
+                      {"mhz", megahertzNumber(channel->hertz)}};
 }
 
 std::string channelText(const SystemWords& words, const Channel& channel) {
@@ -188,6 +191,28 @@ Answer answerFor(RadioSystem system, const BandPart& part) {
     return answer;
 }
 
+std::string edgesText(const UnnumberedBand::Edges& edges) {
+    return formatText("%@ to %@ MHz, ARFCN assigned by the network",
+                      {megahertzText(edges.low), megahertzText(edges.high)});
+}
+
+PropertyList edgesObject(const UnnumberedBand::Edges& edges) {
+    const auto edge = [](Hertz hertz) {
+        return Dictionary{{"channel", {}}, {"mhz", megahertzNumber(hertz)}};
+    };
+    return Dictionary{{"first", edge(edges.low)}, {"last", edge(edges.high)}};
+}
+
+Answer answerFor(RadioSystem system, const UnnumberedBand& band) {
+    return {std::string(band.band),
+            {{"downlink", edgesText(band.downlink)}, {"uplink", edgesText(band.uplink)}},
+            {{"about", "band"},
+             {"system", std::string(nameOf(system))},
+             {"band", std::string(band.band)},
+             {"downlink", edgesObject(band.downlink)},
+             {"uplink", edgesObject(band.uplink)}}};
+}
+
 /// "XIX" for 19: names of UMTS bands.
 std::string romanNumeral(std::uint32_t number) {
     constexpr auto kNumerals = std::to_array<std::pair<std::uint32_t, std::string_view>>(
@@ -234,11 +259,15 @@ AnswersResult explainBand(std::string_view topic, Words operands, const Library&
         wanted.append(wanted.empty() ? "" : " ").append(lowerCase(word));
     }
     Answers answers;
-    for (const BandPart& part : bandsOf(*system)) {
-        if (operands.size() == 1 || isCalled(part.band, *system, wanted)) {
-            answers.answers.push_back(answerFor(*system, part));
+    const auto add = [&](const auto& bands) {
+        for (const auto& band : bands) {
+            if (operands.size() == 1 || isCalled(band.band, *system, wanted)) {
+                answers.answers.push_back(answerFor(*system, band));
+            }
         }
-    }
+    };
+    add(bandsOf(*system));
+    add(unnumberedBandsOf(*system));
     if (answers.answers.empty()) {
         return unknown(formatText("%@ has no band \"%@\".", {operands[0], wanted}));
     }

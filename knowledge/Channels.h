@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -54,8 +55,21 @@ struct BandPart {
     std::optional<Range> uplink;
 };
 
-/// Every band of a system, in the order of the standards.
+/// Every band of a system with fixed channel numbers, in the order of the standards.
 std::vector<BandPart> bandsOf(RadioSystem system);
+
+/// A band whose channel numbers the network assigns.
+struct UnnumberedBand {
+    struct Edges {
+        Hertz low;
+        Hertz high;
+    };
+
+    std::string_view band;
+    Edges downlink;
+    Edges uplink;
+};
+std::span<const UnnumberedBand> unnumberedBandsOf(RadioSystem system);
 
 /// The bands of a number, separated by "/": "3", "DCS 1800/PCS 1900". Only those of the downlink,
 /// if it has any.

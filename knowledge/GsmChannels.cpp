@@ -18,13 +18,14 @@ constexpr ChannelRow gsmRow(std::string_view band, std::uint32_t first, std::uin
 // 3GPP TS 45.005, section 2; frequencies of the first channel, in MHz. P-GSM is part of E-GSM, and
 // so on: each channel of 900 MHz is listed once, in the smallest band.
 //
-// The network assigns the numbers of GSM 710 and T-GSM 810. GSM 710 is therefore missing; the
-// numbers of T-GSM 810 are those that other programs assume.
+// The network assigns the numbers of GSM 710 and T-GSM 810. GSM 710 therefore has no row; the
+// numbers of T-GSM 810 are those that other programs assume. In GSM 750, phones send above the
+// network.
 constexpr auto kRows = std::to_array<ChannelRow>({
     // clang-format off
     gsmRow("GSM 450",    259,  293,  460.6,  450.6),
     gsmRow("GSM 480",    306,  340,  489.0,  479.0),
-    gsmRow("GSM 750",    438,  511,  777.2,  747.2),
+    gsmRow("GSM 750",    438,  511,  747.2,  777.2),
     gsmRow("T-GSM 810",  350,  425,  851.0,  806.0),
     gsmRow("GSM 850",    128,  251,  869.2,  824.2),
     gsmRow("P-GSM 900",    1,  124,  935.2,  890.2),
@@ -36,10 +37,18 @@ constexpr auto kRows = std::to_array<ChannelRow>({
     // clang-format on
 });
 
+constexpr auto kUnnumbered = std::to_array<UnnumberedBand>({
+    {"GSM 710", {fromMegahertz(728), fromMegahertz(746)}, {fromMegahertz(698), fromMegahertz(716)}},
+});
+
 } // namespace
 
 std::span<const ChannelRow> gsmRows() {
     return kRows;
+}
+
+std::span<const UnnumberedBand> unnumberedBandsOf(RadioSystem system) {
+    return system == RadioSystem::Gsm ? kUnnumbered : std::span<const UnnumberedBand>();
 }
 
 } // namespace pallax

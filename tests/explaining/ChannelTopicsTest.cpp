@@ -86,6 +86,19 @@ TEST_F(ChannelTopics, ABandIsItsChannelsAndFrequencies) {
               "2: explain band takes gsm, umts, utran, lte, nr or cdma, not \"4g\"");
 }
 
+TEST_F(ChannelTopics, ABandWithoutFixedNumbersHasItsEdges) {
+    EXPECT_EQ(told({"band", "gsm", "710"}),
+              "GSM 710\n"
+              "  downlink  728.0 to 746.0 MHz, ARFCN assigned by the network\n"
+              "  uplink    698.0 to 716.0 MHz, ARFCN assigned by the network\n");
+    EXPECT_EQ(
+        json({"band", "gsm", "710"}),
+        R"({"about":"band","system":"gsm","band":"GSM 710",)"
+        R"("downlink":{"first":{"channel":null,"mhz":728},"last":{"channel":null,"mhz":746}},)"
+        R"("uplink":{"first":{"channel":null,"mhz":698},"last":{"channel":null,"mhz":716}}})"
+        "\n");
+}
+
 TEST_F(ChannelTopics, ABandIsCalledWhatPeopleCallIt) {
     EXPECT_EQ(told({"band", "nr", "78"}), told({"band", "nr", "N78"}));
     EXPECT_EQ(told({"band", "umts", "19"}), told({"band", "umts", "xix"}));
@@ -107,7 +120,8 @@ TEST_F(ChannelTopics, ABandIsCalledWhatPeopleCallIt) {
 TEST_F(ChannelTopics, ASystemAloneHasAllItsBands) {
     for (const char* system : {"gsm", "umts", "utran", "lte", "nr", "cdma"}) {
         EXPECT_EQ(ask({"band", system})->answers.size(),
-                  bandsOf(radioSystemNamed(system).value()).size());
+                  bandsOf(radioSystemNamed(system).value()).size() +
+                      unnumberedBandsOf(radioSystemNamed(system).value()).size());
     }
 }
 

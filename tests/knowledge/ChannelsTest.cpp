@@ -169,6 +169,15 @@ TEST(Channels, AFrequencyIsToldOnlyIfItIsCertain) {
     EXPECT_EQ(bandText(RadioSystem::Lte, 5000), "");
 }
 
+TEST(Channels, TheNetworkNumbersOneBand) {
+    const auto bands = unnumberedBandsOf(RadioSystem::Gsm);
+    ASSERT_EQ(bands.size(), 1U);
+    EXPECT_EQ(bands[0].band, "GSM 710");
+    EXPECT_EQ(bands[0].downlink.low, 728'000'000);
+    EXPECT_EQ(bands[0].uplink.high, 716'000'000);
+    EXPECT_TRUE(unnumberedBandsOf(RadioSystem::Lte).empty());
+}
+
 TEST(Channels, FrequenciesAreTextsWithoutNeedlessZeros) {
     EXPECT_EQ(megahertzText(0), "0.0");
     EXPECT_EQ(megahertzText(1'870'000'000), "1870.0");
