@@ -68,7 +68,8 @@ TEST_F(EndToEndClosedPipe, EndsHelpAndVersion) {
     endsQuietly({"--help"});
     endsQuietly({"--version"});
     for (const char* command :
-         {"decode", "record", "service", "demo", "simulate", "fields", "info"}) {
+         {"decode", "record", "service", "demo", "simulate", "events", "fields", "explain", "info",
+          "sql"}) {
         endsQuietly({command, "--help"});
     }
 }
@@ -91,6 +92,11 @@ TEST_F(EndToEndClosedPipe, EndsFields) {
         endsQuietly(arguments);
         endsQuietlyAfterTheBeginning(arguments);
     }
+}
+
+TEST_F(EndToEndClosedPipe, EndsExplain) {
+    endsQuietly({"explain", "band", "lte"});
+    endsQuietly({"explain", "--json", "band", "lte"});
 }
 
 TEST_F(EndToEndClosedPipe, EndsDecode) {

@@ -57,6 +57,7 @@ TEST_F(EndToEndDescriptors, AClosedStandardOutputIsNoSuccessAndNoRecordingIsWrit
           "--jobs 1 --every packet >&- 2>err",
           "PALLAX decode gsm-attach.pcap a.pcap --jobs 2 >&- 2>err", "PALLAX fields >&- 2>err",
           "PALLAX fields --json >&- 2>err", "PALLAX info gsm-attach.pcap >&- 2>err",
+          "PALLAX explain earfcn 1850 >&- 2>err", "PALLAX sql gsm-attach.pcap 'select 1' >&- 2>err",
           "PALLAX --help >&- 2>err", "PALLAX a.pcap --print >&- 2>err"}) {
         EXPECT_EQ(shell(line), 1) << line;
         EXPECT_EQ(contentOf(world.path("err")), sentence) << line;

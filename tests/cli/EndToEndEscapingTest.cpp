@@ -112,6 +112,10 @@ TEST_F(EndToEndEscaping, NoFileNameSettingOrOptionInASentenceCommandsTheTerminal
     EXPECT_EQ(commandIn(technology), "") << technology;
     EXPECT_NE(technology.find(kEscaped), std::string::npos) << technology;
 
+    const std::string word = onTerminal({"explain", kHostile}, 1);
+    EXPECT_EQ(commandIn(word), "") << word;
+    EXPECT_NE(word.find(kEscaped), std::string::npos) << word;
+
     std::ofstream(world.path("config/pallax/pallax.conf"))
         << "on-fatal-record = " << kHostile << "\n";
     const std::string setting = onTerminal({"demo", "lte"}, 1);

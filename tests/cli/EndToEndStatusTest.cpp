@@ -197,6 +197,20 @@ TEST_F(EndToEndStatus, OfEvents) {
     ends({{"events"}, 2, "pallax: RECORDING is required (see pallax events --help)\n"});
 }
 
+TEST_F(EndToEndStatus, OfExplain) {
+    ends({{"explain", "earfcn", "1850"}, 0, ""});
+    ends({{"explain", "earfcn", "5000"}, 1, "pallax: No band has EARFCN 5000.\n"});
+    ends({{"explain", "earfcn", "1850"},
+          1,
+          "pallax: Standard output cannot be written: No space left on device.\n",
+          "/dev/null",
+          "/dev/full"});
+    ends({{"explain", "earfcn"},
+          2,
+          "pallax: explain earfcn takes a channel number (see pallax explain --help)\n"});
+    expectEveryDocumentedStatus({"explain"});
+}
+
 TEST_F(EndToEndStatus, OfTheTextsForPackages) {
     const std::string full =
         "pallax: Standard output cannot be written: No space left on device.\n";
