@@ -1,6 +1,5 @@
 #include "browsing/Browse.h"
 
-#include "LogGenerator/Technologies/Technologies.h"
 #include "browsing/BrowseOptions.h"
 #include "browsing/KeptNotices.h"
 #include "browsing/PrintBrowser.h"
@@ -10,10 +9,12 @@
 #include "console/TeeSink.h"
 #include "decoding/FatalRecord.h"
 #include "decoding/Preconditions.h"
+#include "decoding/SnapshotDisplay.h"
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/LogSinks.h"
 #include "host/RecordingFile.h"
+#include "host/Snapshot.h"
 #include "link/Settings.h"
 #include "telephony/ChildService.h"
 #include "ui/terminal/TerminalRestorer.h"
@@ -120,7 +121,16 @@ std::optional<std::string> refusalOf(const Source& source) {
     if (!recording) {
         return std::nullopt; // the child service reports it, as for an unknown link type
     }
-    return missingGenerator(**recording, technologies());
+    return missingGenerator(**recording, technologiesWithSnapshots(SnapshotDisplays::Together));
+}
+
+bool isSnapshot(const Source& source) {
+    const auto* file = std::get_if<FileRecording>(&source);
+    if (file == nullptr) {
+        return false;
+    }
+    const Recording::OpenResult recording = Recording::open(file->path);
+    return recording && (*recording)->technology() == &kSnapshotTechnology;
 }
 
 /// Starts the requested service. A named stream is opened here, where waiting for it can be
@@ -173,7 +183,11 @@ ExitStatus browseWithLog(const Request& request) {
 
 } // namespace
 
-ExitStatus runBrowse(const BrowseOptions& options) {
+ExitStatus runBrowse(const BrowseOptions& wanted) {
+    BrowseOptions options = wanted;
+    if (isSnapshot(options.source)) {
+        options.play.speed = PlayOptions::kAsFastAsTaken; // its displays stand side by side
+    }
     const Interruption interruption(
         {terminal::TerminalRestorer::release, terminal::TerminalRestorer::restore});
     const SettingsResult settings = loadSettings(settingsFiles());

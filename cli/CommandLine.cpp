@@ -95,6 +95,7 @@ CommandLine::CommandLine()
     addExplain(addCommand("explain", "Explain a channel, a network code, a field or a value"),
                _explain);
     addInfo(addCommand("info", "Tell what recordings hold"), _info);
+    addSnapshot(addCommand("snapshot", "Write a part of a saved snapshot"), _snapshot);
     addSql(addCommand("sql", "Ask a recording in SQL"), _sql);
     addTexts();
 }
@@ -211,6 +212,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("sql")) {
         return _sql;
+    }
+    if (_app->got_subcommand("snapshot")) {
+        return _snapshot;
     }
     return _browse;
 }

@@ -2,6 +2,7 @@
 
 #include "cli/OptionParts.h"
 #include "decoding/InfoCommand.h"
+#include "decoding/SnapshotCommand.h"
 #include "querying/SqlCommand.h"
 
 #include <CLI/CLI.hpp>
@@ -24,6 +25,9 @@ A record is counted as "damaged" if it is shorter than its header of 13 bytes,
 if its log type is neither 1 nor 255, or if its length is refused by every
 section that reads its log code; a message of an object stream, if it is empty.
 Contents are not checked.
+
+Of a saved snapshot, its displays and the size of its DLF log are told. Displays
+that share a section all show it as it was when the snapshot was saved.
 
 "fills" names the sections that the recording has data for, "leaves" the others.
 A file that is cut or damaged is described as far as it can be read.
@@ -70,11 +74,32 @@ Exit status:
       recording is damaged or the query was stopped
   2   wrong usage: an unknown option, or a query that is wrong)";
 
+constexpr const char* kSnapshotFooter = R"(Examples:
+  pallax snapshot --dlf PallaxSnapshot-1700000000.pallax -o drive.dlf
+
+To browse the displays of a snapshot, open it (pallax FILE); pallax decode
+writes them as JSON or CSV, and pallax info tells what a snapshot holds. An
+existing output file is replaced.
+
+Exit status:
+  0   success, or the reader of the output has gone
+  1   failure: not a snapshot, without a DLF log, or the output cannot be written
+  2   wrong usage)";
+
 } // namespace
+
+void addSnapshot(CLI::App& app, SnapshotOptions& options) {
+    app.add_flag("--dlf", options.dlf, "Write the DLF log")->required();
+    app.add_option("-o,--output", options.output,
+                   "The file to write (default: -, which is standard output)")
+        ->type_name("FILE");
+    app.add_option("FILE", options.file, "A saved snapshot")->required()->type_name("");
+    app.footer(kSnapshotFooter);
+}
 
 void addInfo(CLI::App& app, InfoOptions& options) {
     app.add_flag("--json", options.json, "JSON, one object per file");
-    app.add_option("RECORDING", options.files, "Recordings (pcap or pcapng)")
+    app.add_option("RECORDING", options.files, "Recordings (pcap or pcapng) and snapshots")
         ->required()
         ->type_name("");
     app.footer(kInfoFooter);

@@ -7,10 +7,12 @@ class App;
 namespace pallax {
 
 struct InfoOptions;
+struct SnapshotOptions;
 struct SqlOptions;
 
 /// The options of the commands that look into files. They must outlive the app.
 void addInfo(CLI::App& app, InfoOptions& options);
+void addSnapshot(CLI::App& app, SnapshotOptions& options);
 void addSql(CLI::App& app, SqlOptions& options);
 
 } // namespace pallax

@@ -6,6 +6,7 @@
 #include "decoding/EventsCommand.h"
 #include "decoding/FieldsCommand.h"
 #include "decoding/InfoCommand.h"
+#include "decoding/SnapshotCommand.h"
 #include "explaining/ExplainCommand.h"
 #include "querying/SqlCommand.h"
 #include "recording/RecordOptions.h"
@@ -34,7 +35,7 @@ struct ServiceStatusOptions {};
 using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions, InfoOptions,
-                 SqlOptions, ParseEnd>;
+                 SnapshotOptions, SqlOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -4,6 +4,7 @@
 #include "decoding/Decode.h"
 #include "decoding/FatalRecord.h"
 #include "decoding/InfoCommand.h"
+#include "decoding/SnapshotCommand.h"
 #include "host/Complaint.h"
 #include "host/StandardDescriptors.h"
 #include "recording/Record.h"
@@ -33,6 +34,7 @@ struct Run {
     ExitStatus operator()(const EventsOptions& options) const { return runEvents(options); }
     ExitStatus operator()(const FieldsOptions& options) const { return runFields(options); }
     ExitStatus operator()(const ExplainOptions& options) const { return runExplain(options); }
+    ExitStatus operator()(const SnapshotOptions& options) const { return runSnapshot(options); }
     ExitStatus operator()(const InfoOptions& options) const { return runInfo(options); }
     ExitStatus operator()(const SqlOptions& options) const { return runSql(options); }
     ExitStatus operator()(const ParseEnd& end) const {

@@ -1,6 +1,5 @@
 #include "decoding/Decode.h"
 
-#include "LogGenerator/Technologies/Technologies.h"
 #include "console/ScopedLog.h"
 #include "decoding/DecodeCommand.h"
 #include "decoding/DecodeProgress.h"
@@ -9,6 +8,7 @@
 #include "decoding/OrderedWorkers.h"
 #include "decoding/Preconditions.h"
 #include "decoding/RequiredTemplates.h"
+#include "decoding/SnapshotDisplay.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
 #include "host/LogSinks.h"
@@ -57,8 +57,10 @@ ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, c
     const auto open = [&report](const std::string& path) {
         return Recording::openInput({path, {}, report});
     };
-    DecodeCommand command(options, {resources, bundle, notices, technologies()}, open, report,
-                          progress.isShown() ? &progress : nullptr, localZone);
+    DecodeCommand command(
+        options,
+        {resources, bundle, notices, technologiesWithSnapshots(SnapshotDisplays::OneByOne)}, open,
+        report, progress.isShown() ? &progress : nullptr, localZone);
     return use(command);
 }
 

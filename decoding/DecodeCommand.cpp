@@ -74,10 +74,8 @@ ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destin
     if (_options.select.empty()) {
         return decodeWith(recording, *technology, destination);
     }
-    SelectedOutput selected(
-        destination.displays,
-        FieldSelection(_options.select,
-                       FieldRegistry(gatherReference(*technology, _environment.resources))));
+    SelectedOutput selected(destination.displays,
+                            {_options.select, *technology, _environment.resources});
     return decodeWith(recording, *technology, {destination.output, selected});
 }
 

@@ -2,6 +2,7 @@
 
 #include "app/tree/ShownEntries.h"
 #include "host/Recording.h"
+#include "host/Snapshot.h"
 
 #include <algorithm>
 #include <fnmatch.h>
@@ -17,7 +18,16 @@ bool hasName(const FieldInfo& field, const std::string& name) {
 } // namespace
 
 FieldSelection::FieldSelection(const std::vector<std::string>& names,
-                               const FieldRegistry& registry) {
+                               const RecordedTechnology& technology, const Resources& resources) {
+    for (const RecordedTechnology& each : recordedTechnologies()) {
+        if (technology.linkType == each.linkType ||
+            technology.linkType == kSnapshotTechnology.linkType) {
+            add(names, FieldRegistry(gatherReference(each, resources)));
+        }
+    }
+}
+
+void FieldSelection::add(const std::vector<std::string>& names, const FieldRegistry& registry) {
     for (const FieldInfo& field : registry.fields()) {
         if (std::any_of(names.begin(), names.end(),
                         [&field](const std::string& name) { return hasName(field, name); })) {

@@ -15,7 +15,12 @@ namespace pallax {
 /// one.
 class FieldSelection {
 public:
-    FieldSelection(const std::vector<std::string>& names, const FieldRegistry& registry);
+    FieldSelection(const std::vector<std::string>& names, const FieldRegistry& registry) {
+        add(names, registry);
+    }
+    /// Of the technology of a recording; a snapshot does not tell its own and can have any.
+    FieldSelection(const std::vector<std::string>& names, const RecordedTechnology& technology,
+                   const Resources& resources);
 
     /// The first name that no field of any technology has.
     static std::optional<std::string> unknownName(const std::vector<std::string>& names,
@@ -26,6 +31,7 @@ public:
     PropertyList of(const PropertyList& display) const;
 
 private:
+    void add(const std::vector<std::string>& names, const FieldRegistry& registry);
     bool isInside(const std::string& path) const;
     std::optional<PropertyList> valueAt(const PropertyList& value, const std::string& path) const;
     std::optional<PropertyList> elementsOf(const Array& elements, const std::string& path) const;

@@ -3,8 +3,10 @@
 #include "console/Output.h"
 #include "decoding/Preconditions.h"
 #include "decoding/RequiredTemplates.h"
+#include "decoding/SnapshotText.h"
 #include "decoding/SummaryText.h"
 #include "host/Complaint.h"
+#include "host/Snapshot.h"
 #include "host/WallClock.h"
 
 #include <unistd.h>
@@ -28,7 +30,29 @@ ExitStatus InfoCommand::describe(const std::string& path, Output& output) {
         _environment.report(recording.error().sentence);
         return kExitFailure;
     }
-    return describe(**recording, output);
+    return (*recording)->technology() == &kSnapshotTechnology ? describeSnapshot(path, output)
+                                                              : describe(**recording, output);
+}
+
+ExitStatus InfoCommand::describeSnapshot(const std::string& path, Output& output) {
+    const auto snapshot = readSnapshot(path);
+    if (!snapshot) {
+        _environment.report(path + " is no longer a snapshot.");
+        return kExitFailure;
+    }
+    if (_options.json) {
+        appendSnapshotJson(output.text(), path, *snapshot);
+    } else {
+        separate(output);
+        appendSnapshotText(output.text(), path, *snapshot);
+    }
+    output.lineDone();
+    return kExitSuccess;
+}
+
+/// Begins the text of a file.
+void InfoCommand::separate(Output& output) {
+    output.text() += std::exchange(_isFirst, false) ? "" : "\n";
 }
 
 ExitStatus InfoCommand::describe(Recording& recording, Output& output) {
@@ -41,7 +65,7 @@ ExitStatus InfoCommand::describe(Recording& recording, Output& output) {
     if (_options.json) {
         appendSummaryJson(output.text(), file);
     } else {
-        output.text() += std::exchange(_isFirst, false) ? "" : "\n";
+        separate(output);
         appendSummaryText(output.text(), file, _environment.zone);
     }
     output.lineDone();

@@ -41,6 +41,8 @@ public:
 private:
     ExitStatus describe(const std::string& path, Output& output);
     ExitStatus describe(Recording& recording, Output& output);
+    ExitStatus describeSnapshot(const std::string& path, Output& output);
+    void separate(Output& output);
     /// Null for an unknown technology.
     const RecordingSummary::Codes* codesOf(const RecordedTechnology* technology);
 

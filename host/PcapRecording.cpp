@@ -3,6 +3,7 @@
 #include "host/Decompression.h"
 #include "host/Recording.h"
 #include "host/RecordingFile.h"
+#include "host/Snapshot.h"
 #include "text/Format.h"
 
 #include <pcap/pcap.h>
@@ -227,11 +228,7 @@ RecordingError noCapture(const OpenedFile& file, const std::string& name, std::s
     return errorOf(Kind::Unreadable, name, formatText("cannot be read: %@", {reason}));
 }
 
-} // namespace
-
-Recording::OpenResult Recording::openInput(const Input& input) {
-    const std::string path = input.path == "-" ? "standard input" : input.path;
-    const std::string& name = input.name.empty() ? path : input.name;
+Recording::OpenResult openCapture(const Recording::Input& input, const std::string& name) {
     auto opened = openFile(input, name);
     if (!opened) {
         return opened.error();
@@ -269,6 +266,20 @@ Recording::OpenResult Recording::openInput(const Input& input) {
     const StampForm form = firstOfContent == kFirstOfPcapNg ? StampForm::PcapNg : StampForm::Pcap;
     return std::unique_ptr<Recording>(
         std::make_unique<PcapRecording>(name, capture, form, std::move(file)));
+}
+
+} // namespace
+
+Recording::OpenResult Recording::openInput(const Input& input) {
+    const std::string path = input.path == "-" ? "standard input" : input.path;
+    const std::string& name = input.name.empty() ? path : input.name;
+    OpenResult capture = openCapture(input, name);
+    if (!capture && capture.error().kind == Kind::NoCapture && input.path != "-") {
+        if (auto snapshot = recordingOfSnapshot(input.path, name)) {
+            return snapshot;
+        }
+    }
+    return capture;
 }
 
 } // namespace pallax

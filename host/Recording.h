@@ -45,7 +45,8 @@ public:
     };
 
     /// A file of zero bytes is Empty, any other file that is not a capture is NoCapture. A capture
-    /// without packets is not an error.
+    /// without packets is not an error. A saved snapshot is a recording with a message for each of
+    /// its displays (host/Snapshot.h).
     static OpenResult openInput(const Input& input);
     static OpenResult open(const std::string& path) { return openInput({path}); }
 

@@ -1,6 +1,6 @@
 #include "link/BrowseLink.h"
 
-#include "LogGenerator/Technologies/Technologies.h"
+#include "decoding/SnapshotDisplay.h"
 #include "telephony/ChildService.h"
 #include "text/Format.h"
 
@@ -28,8 +28,13 @@ BrowseLink::BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, C
       _resources(DirectoryResources::programFolder()) {}
 
 ModemLink::Platform BrowseLink::platform() {
-    return {_ports,         _linkPorts,    _queue, _clock, {_clock, _resources, _bundle, _notices},
-            technologies(), _localPortName};
+    return {_ports,
+            _linkPorts,
+            _queue,
+            _clock,
+            {_clock, _resources, _bundle, _notices},
+            technologiesWithSnapshots(SnapshotDisplays::Together),
+            _localPortName};
 }
 
 bool BrowseLink::childHasEnded() const {

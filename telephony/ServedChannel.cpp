@@ -1,5 +1,6 @@
 #include "telephony/ServedChannel.h"
 
+#include "host/Snapshot.h"
 #include "host/SocketMessagePorts.h"
 #include "platform/TelephonyConstants.h"
 #include "telephony/ControlMessages.h"
@@ -71,7 +72,8 @@ std::optional<ByteBuffer> ServedChannel::answer(Bytes request) {
     if (stringIn(*message, "GetTechnology") == "GetTechnology") {
         return encodeMessage({{"GetTechnology", technology}});
     }
-    const bool everything = technology == kHXLogChannelTechnology_IFX;
+    const bool everything =
+        technology == kHXLogChannelTechnology_IFX || technology == kSnapshotTechnology.identifier;
     if (auto filter = CodeFilter::fromStartCommand(*message, everything)) {
         _hasStarted = true;
         _isStreaming = !_hasEnded;

@@ -67,9 +67,8 @@ private:
 TEST_F(EndToEndClosedPipe, EndsHelpAndVersion) {
     endsQuietly({"--help"});
     endsQuietly({"--version"});
-    for (const char* command :
-         {"decode", "record", "service", "demo", "simulate", "events", "fields", "explain", "info",
-          "sql"}) {
+    for (const char* command : {"decode", "record", "service", "demo", "simulate", "events",
+                                "fields", "explain", "info", "snapshot", "sql"}) {
         endsQuietly({command, "--help"});
     }
 }

@@ -6,6 +6,8 @@
 #include <csignal>
 #include <ctime>
 #include <fcntl.h>
+#include <filesystem>
+#include <fstream>
 #include <sys/stat.h>
 
 namespace pallax {
@@ -62,6 +64,61 @@ TEST_F(EndToEndSnapshot, TwoSavesAtTheEndOfARecordingAreTwoFilesNamedAfterThePre
         ASSERT_EQ(::stat(file.c_str(), &status), 0);
         EXPECT_EQ(status.st_mode & 0777U, 0600U);
     }
+}
+
+TEST_F(EndToEndSnapshot, ASavedOneOpens) {
+    PallaxTerminal terminal(world, {brief(), "--speed", "max"}, {});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    save(terminal);
+    quit(terminal);
+    const std::string file = filesIn(snapshots).at(0);
+    const Dictionary contents = contentsOf(file);
+    // Under any name, with the display that the recording ends with.
+    const std::string path = world.path("colleague");
+    std::filesystem::copy(file, path);
+    const Run decoded = run({"decode", path});
+    EXPECT_EQ(decoded.status, 0);
+    EXPECT_EQ(decoded.err, "");
+    EXPECT_EQ(decoded.out, run({"decode", brief()}).out);
+    const Run info = run({"info", path});
+    EXPECT_EQ(info.status, 0);
+    EXPECT_TRUE(info.out.starts_with(path + "\n  format      snapshot\n"
+                                            "  saved       2023-11-14 22:13:22 +0000\n"))
+        << info.out;
+
+    const Run log = run({"snapshot", "--dlf", path, "-o", world.path("log.dlf")});
+    EXPECT_EQ(log.status, 0);
+    EXPECT_EQ(log.err, "");
+    const auto entries = *contents.find("Data")->array();
+    const auto expected = *entries.back().dictionary()->find("DLF")->data();
+    EXPECT_EQ(contentOf(world.path("log.dlf")), std::string(expected.begin(), expected.end()));
+    EXPECT_EQ(run({"snapshot", "--dlf", path}).out, contentOf(world.path("log.dlf")));
+
+    const Run printed = run({path, "--print"});
+    EXPECT_EQ(printed.status, 0);
+    EXPECT_NE(printed.out.find("\n  Note: Displays that share a section all show it as it was "),
+              std::string::npos);
+    PallaxTerminal again(world, {path}, {});
+    EXPECT_TRUE(again.shows("Snapshot (2023-11-14 22:13:22 +0000)"));
+    quit(again);
+}
+
+TEST_F(EndToEndSnapshot, WhatIsNoneIsRefused) {
+    const std::string recording = brief();
+    const Run none = run({"snapshot", "--dlf", recording});
+    EXPECT_EQ(none.status, 1);
+    EXPECT_EQ(none.err, "pallax: " + recording + " is not a snapshot.\n");
+    const Run missing = run({"snapshot", "--dlf", world.path("missing")});
+    EXPECT_EQ(missing.status, 1);
+    EXPECT_EQ(missing.err, "pallax: " + world.path("missing") +
+                               " cannot be opened: No such file or directory.\n");
+    const auto empty = serializeXml(Dictionary{{"Timestamp", "now"}, {"Data", Array{}}});
+    const std::string path = world.path("empty.pallax");
+    std::ofstream(path) << *empty;
+    EXPECT_EQ(run({"snapshot", "--dlf", path}).err, "pallax: " + path + " holds no DLF log.\n");
+    EXPECT_EQ(run({"decode", path}).out, "null\n");
+    PallaxTerminal terminal(world, {"snapshot", "--dlf", path}, {});
+    EXPECT_EQ(terminal.wait(), 2);
 }
 
 TEST_F(EndToEndSnapshot, ATextThatXmlCannotRepresentIsSaved) {

@@ -211,6 +211,17 @@ TEST_F(EndToEndStatus, OfExplain) {
     expectEveryDocumentedStatus({"explain"});
 }
 
+TEST_F(EndToEndStatus, OfSnapshot) {
+    const std::string path = world.path("saved.pallax");
+    std::ofstream(path) << "<plist><dict><key>Timestamp</key><string>now</string><key>Data</key>"
+                           "<array><dict><key>DLF</key><data>AQI=</data></dict></array></dict>"
+                           "</plist>";
+    ends({{"snapshot", "--dlf", path}, 0, ""});
+    ends({{"snapshot", "--dlf", sample}, 1, "pallax: " + sample + " is not a snapshot.\n"});
+    ends({{"snapshot", path}, 2, "pallax: --dlf is required (see pallax snapshot --help)\n"});
+    expectEveryDocumentedStatus({"snapshot"});
+}
+
 TEST_F(EndToEndStatus, OfTheTextsForPackages) {
     const std::string full =
         "pallax: Standard output cannot be written: No space left on device.\n";

@@ -259,6 +259,14 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
               "service --help)\n");
 }
 
+TEST(Options, SnapshotTakesAFile) {
+    const auto log = parsed<SnapshotOptions>({"snapshot", "--dlf", "a.pallax"});
+    EXPECT_EQ(log.file, "a.pallax");
+    EXPECT_EQ(log.output, "-");
+    EXPECT_TRUE(log.dlf);
+    EXPECT_EQ(parsed<SnapshotOptions>({"snapshot", "--dlf", "a", "-o", "b"}).output, "b");
+}
+
 TEST(Options, InfoTakesFiles) {
     const auto info = parsed<InfoOptions>({"info", "a.pcap", "--json", "-"});
     EXPECT_EQ(info.files, (std::vector<std::string>{"a.pcap", "-"}));
@@ -308,8 +316,9 @@ TEST(Options, EventsAreOfRecordings) {
 }
 
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
-    for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "events",
-                                "fields", "explain", "info", "sql", "completion", "manual"}) {
+    for (const char* command :
+         {"", "decode", "record", "service", "demo", "simulate", "events", "fields", "explain",
+          "info", "snapshot", "sql", "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);

@@ -49,7 +49,7 @@ TEST_F(Completion, BashOffersCommands) {
     EXPECT_EQ(inBash("pallax de", 1), "decode\ndemo\n");
     EXPECT_EQ(inBash("pallax f", 1), "fields\n");
     folder.write("seven.pcap", "");
-    EXPECT_EQ(inBash("pallax s", 1), "service\nsimulate\nseven.pcap\n") << "and files";
+    EXPECT_EQ(inBash("pallax s", 1), "service\nsimulate\nsnapshot\nseven.pcap\n") << "and files";
 }
 
 TEST_F(Completion, BashOffersTheOptionsOfTheCommand) {
@@ -82,7 +82,7 @@ TEST_F(Completion, BashOffersFilesWhereARecordingOrFileIsTaken) {
 
 TEST_F(Completion, EveryOptionIsInEveryScript) {
     const CommandDescription program = CommandLine().description();
-    ASSERT_EQ(program.commands.size(), 7U);
+    ASSERT_EQ(program.commands.size(), 8U);
     const std::string fish = script("fish");
     for (const CommandDescription& command : program.commands) {
         ASSERT_GE(command.options.size(), 3U);

@@ -30,11 +30,11 @@ CommandDescription program() {
 }
 
 TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
-    EXPECT_EQ(
-        manualPages(program()),
-        (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record", "pallax-service",
-                                  "pallax-demo", "pallax-simulate", "pallax-events",
-                                  "pallax-fields", "pallax-explain", "pallax-info", "pallax-sql"}));
+    EXPECT_EQ(manualPages(program()),
+              (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record",
+                                        "pallax-service", "pallax-demo", "pallax-simulate",
+                                        "pallax-events", "pallax-fields", "pallax-explain",
+                                        "pallax-info", "pallax-snapshot", "pallax-sql"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 

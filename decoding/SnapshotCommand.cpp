@@ -1,0 +1,60 @@
+#include "decoding/SnapshotCommand.h"
+
+#include "console/Output.h"
+#include "decoding/Preconditions.h"
+#include "host/Complaint.h"
+#include "host/Files.h"
+#include "host/Snapshot.h"
+#include "plist/PropertyListCodec.h"
+#include "text/Format.h"
+
+#include <unistd.h>
+
+namespace pallax {
+
+namespace {
+
+ExitStatus failed(const std::string& sentence) {
+    complain(sentence);
+    return kExitFailure;
+}
+
+ExitStatus write(const std::string& output, std::string_view content) {
+    if (output == "-") {
+        writeToDescriptor(STDOUT_FILENO, "Standard output")(content);
+        return kExitSuccess;
+    }
+    return replaceFile(output, content) ? kExitSuccess
+                                        : failed(formatText("%@ cannot be written.", {output}));
+}
+
+} // namespace
+
+ExitStatus runSnapshot(const SnapshotOptions& options) {
+    if (options.output == "-" && ::isatty(STDOUT_FILENO) != 0) {
+        complain("Standard output is a terminal; name a file with --output.");
+        return kExitWrongUsage;
+    }
+    if (const auto loss = outputIntoRecording({&options.file, 1})) {
+        return failed(*loss);
+    }
+    const auto content = readRegularFile(options.file, kLargestPropertyList);
+    if (!content) {
+        return failed(
+            formatText("%@ cannot be opened: %@.", {options.file, content.error().reason}));
+    }
+    const auto snapshot = readSnapshot(options.file);
+    if (!snapshot) {
+        return failed(options.file + " is not a snapshot.");
+    }
+    if (snapshot->dlf == nullptr) {
+        return failed(options.file + " holds no DLF log.");
+    }
+    if (recordingAmong({&options.file, 1}, regularFile(options.output))) {
+        return failed(formatText("The DLF log would replace the snapshot %@.", {options.file}));
+    }
+    return write(options.output, {reinterpret_cast<const char*>(snapshot->dlf->data()), // NOLINT
+                                  snapshot->dlf->size()});
+}
+
+} // namespace pallax

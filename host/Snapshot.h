@@ -1,0 +1,51 @@
+#pragma once
+
+#include "host/Recording.h"
+#include "plist/PropertyList.h"
+#include "text/Date.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace pallax {
+
+/// A saved snapshot, as its file holds it.
+struct Snapshot {
+    /// One of the saved displays.
+    struct Display {
+        std::string description;  ///< "Snapshot (2023-11-14 22:13:20 +0000)"
+        std::optional<Time> time; ///< nothing if the file does not give it
+        PropertyList content;     ///< a dictionary
+    };
+
+    std::string saved;             ///< "2023-11-14 22:13:22 +0000"
+    std::string description;       ///< the user's
+    std::vector<Display> displays; ///< oldest first
+    SharedBytes dlf;               ///< the DLF log; null if there is none
+};
+
+/// What every description of a snapshot must say about its displays.
+inline constexpr std::string_view kSharedSections =
+    "Displays that share a section all show it as it was when the snapshot was saved.";
+
+/// A snapshot is recognised by its content: a dictionary with "Timestamp", a string, and "Data", an
+/// array of dictionaries. Nothing for any other object.
+std::optional<Snapshot> snapshotOf(const PropertyList& object);
+
+/// Nothing if the file is not a snapshot or cannot be read.
+std::optional<Snapshot> readSnapshot(const std::string& path);
+
+/// The technology of a snapshot that is read as a recording. Its messages, one for each display,
+/// are dictionaries with these keys.
+inline constexpr RecordedTechnology kSnapshotTechnology{-1, "Snapshot", "snapshot"};
+inline constexpr const char* kSnapshotSaved = "Saved";
+inline constexpr const char* kSnapshotDescription = "Description";
+inline constexpr const char* kSnapshotTitle = "Title";
+inline constexpr const char* kSnapshotDisplay = "Display";
+
+/// The snapshot in a file as a recording; null if the file is not a snapshot.
+std::unique_ptr<Recording> recordingOfSnapshot(const std::string& path, const std::string& name);
+
+} // namespace pallax
