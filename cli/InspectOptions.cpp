@@ -83,7 +83,7 @@ existing output file is replaced.
 
 Exit status:
   0   success, or the reader of the output has gone
-  1   failure: not a snapshot, without a DLF log, or the output cannot be written
+  1   failure: not a snapshot, no DLF log in it, or cannot write the output
   2   wrong usage)";
 
 } // namespace

@@ -173,8 +173,8 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
         app.add_option_function<std::string>(
                "RECORDING",
                [&options](const std::string& path) { options.source = recordingAt(path); },
-               "The recording to browse (pcap or pcapng, a file or a named pipe; - is standard "
-               "input; default: the live modem)")
+               "The recording or saved snapshot to browse (pcap or pcapng, a file or a named "
+               "pipe; - is standard input; default: the live modem)")
             ->type_name("");
     addView(app, options);
     addPlay(app, options.play, recording);
