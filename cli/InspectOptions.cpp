@@ -29,7 +29,7 @@ Contents are not checked.
 Of a saved snapshot, its displays and the size of its DLF log are told. Displays
 that share a section all show it as it was when the snapshot was saved.
 
-"fills" names the sections that the recording has data for, "leaves" the others.
+"fills" names the sections that the recording has data for.
 A file that is cut or damaged is described as far as it can be read.
 
 Exit status:

@@ -6,6 +6,7 @@
 #include "decoding/RecordingSpan.h"
 #include "decoding/SelectedOutput.h"
 #include "decoding/StampSentence.h"
+#include "host/Snapshot.h"
 #include "text/Format.h"
 
 #include <utility>
@@ -65,8 +66,10 @@ ExitStatus DecodeCommand::decodeOpened(const Recording::OpenResult& recording,
 }
 
 ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destination) {
-    const RecordedTechnology* technology =
-        _options.technology != nullptr ? _options.technology : recording.technology();
+    const bool isSnapshot = recording.technology() == &kSnapshotTechnology;
+    const RecordedTechnology* technology = _options.technology != nullptr && !isSnapshot
+                                               ? _options.technology
+                                               : recording.technology();
     if (technology == nullptr) {
         return failed(recording.foreignLinkType().sentence);
     }

@@ -126,7 +126,7 @@ void appendSections(std::string& out, const SummarizedFile& file) {
     out += '\n';
     appendRow(out, "fills", with.empty() ? "no section" : with);
     if (!without.empty()) {
-        appendRow(out, "leaves", without);
+        appendRow(out, "not filled", without);
     }
 }
 
@@ -215,7 +215,7 @@ void addContent(Dictionary& object, const SummarizedFile& file) {
     object.set("unknown", number(summary.unknown()));
     object.set("codes", codesObject(file));
     object.set("fills", sectionsObject(file, true));
-    object.set("leaves", sectionsObject(file, false));
+    object.set("not_filled", sectionsObject(file, false));
 }
 
 } // namespace

@@ -80,6 +80,7 @@ TEST_F(EndToEndSnapshot, ASavedOneOpens) {
     EXPECT_EQ(decoded.status, 0);
     EXPECT_EQ(decoded.err, "");
     EXPECT_EQ(decoded.out, run({"decode", brief()}).out);
+    EXPECT_EQ(run({"decode", "--technology", "lte", path}).out, decoded.out) << "as it was saved";
     const Run info = run({"info", path});
     EXPECT_EQ(info.status, 0);
     EXPECT_TRUE(info.out.starts_with(path + "\n  format      snapshot\n"

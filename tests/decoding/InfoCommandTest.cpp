@@ -93,7 +93,7 @@ TEST_F(InfoCommandTest, TextTellsEverythingAtAGlance) {
          1  0xB0C1    Antennas of the serving cell -> /Serving Cell Info
 
   fills       /Serving Cell Info, /Serving Cell Measurements
-  leaves      /Connected mode LTE Intra-frequency Measurement, /Measured Neighbor Cells, /Detected Cells, /Neighbor Measurements, /Neighbor Cells List, /Reselection Candidates, /Reselection Candidates List, /SIM Info, /PDP Context Info
+  not filled  /Connected mode LTE Intra-frequency Measurement, /Measured Neighbor Cells, /Detected Cells, /Neighbor Measurements, /Neighbor Cells List, /Reselection Candidates, /Reselection Candidates List, /SIM Info, /PDP Context Info
 )");
     EXPECT_EQ(reports, std::vector<std::string>{});
 }
@@ -109,7 +109,7 @@ TEST_F(InfoCommandTest, JsonHasTheSame) {
         R"("error":null,"damaged":1,"unknown":0,"codes":[{"code":"0xB17F","packets":1,)"
         R"("damaged":0,"known":true,"name":"Idle-mode measurement of the serving cell",)"
         R"("sections":["/Serving Cell Measurements"]}],)"
-        R"("fills":["/Serving Cell Measurements"],"leaves":["/Serving Cell Info",)"
+        R"("fills":["/Serving Cell Measurements"],"not_filled":["/Serving Cell Info",)"
         R"("/Connected mode LTE Intra-frequency Measurement","/Measured Neighbor Cells",)"
         R"("/Detected Cells","/Neighbor Measurements","/Neighbor Cells List",)"
         R"("/Reselection Candidates","/Reselection Candidates List","/SIM Info",)"
