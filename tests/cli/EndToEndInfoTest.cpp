@@ -87,5 +87,16 @@ TEST_F(EndToEndInfo, CompressedRecordingsAreReadWhereverPlainOnesAre) {
     }
 }
 
+TEST_F(EndToEndInfo, ACompressedStreamIsRelayed) {
+    const std::string expected = run({"decode", gsmAttach()}).out;
+    doubles::PallaxProcess service(world, {"service", "--relay", "-"},
+                                   compressedAttach(doubles::gzipOf));
+    ASSERT_TRUE(doubles::eventually([this] { return !world.sockets().empty(); }));
+    const std::string recorded = world.path("relayed.pcapng");
+    EXPECT_EQ(run({"record", recorded}).status, 0);
+    EXPECT_EQ(service.wait(), 0);
+    EXPECT_EQ(run({"decode", recorded}).out, expected);
+}
+
 } // namespace
 } // namespace pallax
