@@ -18,15 +18,13 @@ std::optional<std::uint64_t> sizeOf(const std::string& path) {
                : std::nullopt;
 }
 
-/// Whether nothing but a packet lies between two positions, so that what a reader must know stands
-/// at the start of the file: pcap has a header of 16 bytes before each packet, pcapng at least a
-/// block around it.
-bool isPacketAlone(std::uint64_t from, std::uint64_t to, std::size_t length) {
-    constexpr std::uint64_t kPcapHeader = 16;
-    constexpr std::uint64_t kPcapNgBlock = 32;
+constexpr std::uint64_t kPcapHeader = 16;
+
+/// What a packet takes in a pcapng file at least.
+std::uint64_t pcapNgSize(std::size_t length) {
+    constexpr std::uint64_t kBlock = 32;
     constexpr std::uint64_t kWord = 4;
-    return to - from == kPcapHeader + length ||
-           to - from == kPcapNgBlock + (length + kWord - 1) / kWord * kWord;
+    return kBlock + (length + kWord - 1) / kWord * kWord;
 }
 
 } // namespace
@@ -75,6 +73,8 @@ private:
             }
         }
         _position = _recording->position().value_or(0);
+        _asPcap = 0;
+        _asPcapNg = 0;
     }
 
     /// The next packet, wanted or not.
@@ -100,15 +100,32 @@ private:
         }
         _expected.reset();
         const std::uint64_t number = _next++;
-        const std::uint64_t before = std::exchange(_position, _recording->position().value_or(0));
-        const std::uint64_t after = _position;
-        if (after > _journal._read) {
-            _journal._canSeek = _journal._canSeek &&
-                                (number == 1 || isPacketAlone(before, after, packet->data.size()));
-            _journal._read = after;
-            _journal.note({number, before, packet->time, packet->data.size()});
-        }
+        account(*packet, number);
         return JournalPacket{number, packet->time, packet->data};
+    }
+
+    /// Notes the place of every 4096th packet. Where something else than packets lies between two
+    /// such places, a reader from the middle might miss it, so then none is used. (Asking for the
+    /// position takes a system call, so it is not done for each packet.)
+    void account(const RecordedPacket& packet, std::uint64_t number) {
+        const std::size_t length = packet.data.size();
+        _asPcap += kPcapHeader + length;
+        _asPcapNg += pcapNgSize(length);
+        if (number % kPlacesEvery != 1) {
+            return;
+        }
+        const std::uint64_t end = _recording->position().value_or(0);
+        const bool isPcap = end == _position + _asPcap;
+        const bool isPcapNg = end == _position + _asPcapNg;
+        if (_journal._places.empty() || _journal._places.back().packet < number) {
+            _journal._canSeek = _journal._canSeek && (number == 1 || isPcap || isPcapNg);
+            const std::uint64_t size = isPcap ? kPcapHeader + length : pcapNgSize(length);
+            _journal._places.push_back({number, end - size, packet.time, length});
+            _journal._read = end;
+        }
+        _position = end;
+        _asPcap = 0;
+        _asPcapNg = 0;
     }
 
     void stop() {
@@ -129,7 +146,9 @@ private:
     std::uint64_t _next = 1;
     std::uint64_t _continueAt = 0; // after the end: the number of the packet that may follow
     std::uint64_t _sizeAtEnd = 0;
-    std::uint64_t _position = 0;    // in the file, after the latest packet
+    std::uint64_t _position = 0; // in the file, where the reader began or last looked
+    std::uint64_t _asPcap = 0;   // what the packets since take, in each form
+    std::uint64_t _asPcapNg = 0;
     std::optional<Place> _expected; // the packet after a seek
 };
 
@@ -156,12 +175,6 @@ std::unique_ptr<PacketReader> RecordingJournal::reader(std::uint64_t from) {
 
 bool RecordingJournal::isSameFile() const {
     return regularFile(_path) == _identity;
-}
-
-void RecordingJournal::note(const Place& place) {
-    if (place.packet % kPlacesEvery == 1) {
-        _places.push_back(place);
-    }
 }
 
 std::optional<std::string> RecordingJournal::trouble() const {

@@ -27,7 +27,7 @@ public:
     std::unique_ptr<PacketReader> reader(std::uint64_t from) override;
     /// That the file was replaced, changed, or became shorter or longer, or how it ends.
     std::optional<std::string> trouble() const override;
-    /// The part of the file before the latest packet that was read for the first time, 0 to 1.
+    /// The part of the file up to the last place that was noted, 0 to 1.
     double share() const;
 
 private:
@@ -44,14 +44,13 @@ private:
 
     explicit RecordingJournal(std::string path) : _path(std::move(path)) {}
     bool isSameFile() const;
-    void note(const Place& place);
 
     std::string _path;
     FileIdentity _identity;
     std::uint64_t _size = 0; // when it was opened
     const RecordedTechnology* _technology = nullptr;
     std::vector<Place> _places;
-    std::uint64_t _read = 0; // the end of the packet that was read furthest
+    std::uint64_t _read = 0; // the end of the packet at the last place
     bool _canSeek = true;
     bool _hasChanged = false;
     std::optional<std::string> _error;

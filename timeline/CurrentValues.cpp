@@ -35,6 +35,7 @@ void CurrentValues::clear() {
     _values.clear();
     _lists.clear();
     _places.clear();
+    _known.clear();
     _open.clear();
 }
 
@@ -143,10 +144,25 @@ void CurrentValues::empty(std::size_t place) {
     }
 }
 
+std::size_t CurrentValues::placeOf(const SampleList& list, std::size_t outer) {
+    for (const Known& known : _known) {
+        if (list.layout != nullptr && known.layout == list.layout && known.outer == outer &&
+            known.section == _section.data()) {
+            return known.place;
+        }
+    }
+    const ListId outerId = outer != kNone ? _lists[outer].id : 0;
+    const std::size_t place = placeOf(_entries->list(_section, list.key, outerId), outer);
+    if (list.layout != nullptr) {
+        _known.push_back({list.layout, _section.data(), outer, place});
+    }
+    return place;
+}
+
 void CurrentValues::beginList(const SampleList& list) {
     Open open;
     if (_open.empty()) {
-        open.list = placeOf(_entries->list(_section, list.key, 0), kNone);
+        open.list = placeOf(list, kNone);
         empty(open.list);
     } else {
         Open& around = _open.back();
@@ -154,8 +170,7 @@ void CurrentValues::beginList(const SampleList& list) {
         if (around.isInEntry && !around.isIdentified) {
             identify(around);
         }
-        const ListId outer = _lists[around.list].id;
-        open.list = placeOf(_entries->list(_section, list.key, outer), around.list);
+        open.list = placeOf(list, around.list);
         open.outer = around.isInEntry ? slotOf(around).held.entry : around.outer;
     }
     _open.push_back(open);
@@ -225,7 +240,38 @@ void CurrentValues::identify(Open& open) {
 }
 
 EntryId CurrentValues::identified(const Open& open, const Slot& slot) {
-    return _entries->entry(_lists[open.list].id, open.outer, identityOf(open, slot));
+    const ListId list = _lists[open.list].id;
+    const auto numbers = numbersOf(open, slot);
+    EntryId entry = numbers ? _entries->entry(*numbers) : kNoEntry;
+    if (entry == kNoEntry) {
+        entry = _entries->entry(list, open.outer, identityOf(open, slot));
+        if (numbers && entry != EntryTable::kOthers) {
+            _entries->note(*numbers, entry);
+        }
+    }
+    return entry;
+}
+
+/// The identity, if it consists of a few whole numbers.
+std::optional<EntryTable::Numbers> CurrentValues::numbersOf(const Open& open,
+                                                            const Slot& slot) const {
+    EntryTable::Numbers numbers;
+    numbers.list = _lists[open.list].id;
+    numbers.outer = open.outer;
+    for (std::size_t index = 0; index < open.held; ++index) {
+        const auto& [field, value] = slot.held.values[index];
+        if (!_fields->identifies(field)) {
+            continue;
+        }
+        const DisplayNumber* number = value.shown.displayNumber();
+        if (number == nullptr || number->isReal() || numbers.count == numbers.values.size()) {
+            return std::nullopt;
+        }
+        numbers.fields.at(numbers.count) = field;
+        numbers.values.at(numbers.count) = number->integer();
+        numbers.formats.at(numbers.count++) = &number->format();
+    }
+    return numbers.count != 0 ? std::optional(numbers) : std::nullopt;
 }
 
 std::string CurrentValues::identityOf(const Open& open, const Slot& slot) const {

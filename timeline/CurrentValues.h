@@ -115,11 +115,21 @@ private:
 
     void store(FieldValue& target, const Sample& sample) const;
     void sampleInEntry(Open& open, const Sample& sample);
+    /// The place of a list with a layout, so that its name is looked up only once.
+    struct Known {
+        const ListLayout* layout;
+        const char* section;
+        std::size_t outer;
+        std::size_t place;
+    };
+
+    std::size_t placeOf(const SampleList& list, std::size_t outer);
     std::size_t placeOf(ListId id, std::size_t outer);
     void empty(std::size_t place);
     void identify(Open& open);
     EntryId identified(const Open& open, const Slot& slot);
     std::string identityOf(const Open& open, const Slot& slot) const;
+    std::optional<EntryTable::Numbers> numbersOf(const Open& open, const Slot& slot) const;
     Slot& slotOf(const Open& open) {
         List& list = _lists[open.list];
         return list.slots[list.count];
@@ -131,6 +141,7 @@ private:
     std::vector<FieldValue> _values; ///< by field
     std::vector<List> _lists;
     std::unordered_map<ListId, std::size_t> _places;
+    std::vector<Known> _known;
     bool _hasInnerLists = false;
     std::vector<Open> _open;
     std::string_view _section;

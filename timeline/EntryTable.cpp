@@ -32,6 +32,22 @@ EntryId EntryTable::entry(ListId list, EntryId outer, std::string_view identity)
     return add(std::move(key), words.append(identity));
 }
 
+EntryId EntryTable::entry(const Numbers& numbers) const {
+    const auto found = _ofNumbers.find(numbers);
+    return found != _ofNumbers.end() ? found->second : kNoEntry;
+}
+
+std::size_t EntryTable::Hash::operator()(const Numbers& numbers) const {
+    constexpr std::uint64_t kMix = 0x9E3779B97F4A7C15; // odd, with its bits well spread
+    constexpr unsigned kHalf = 32;
+    std::uint64_t hash = std::uint64_t{numbers.list} << kHalf | numbers.outer;
+    for (std::size_t index = 0; index < numbers.count; ++index) {
+        hash = (hash ^ static_cast<std::uint64_t>(numbers.values.at(index))) * kMix;
+        hash ^= hash >> kHalf;
+    }
+    return hash;
+}
+
 EntryId EntryTable::again(EntryId entry, std::size_t time) {
     std::string key = keyOf(entry, static_cast<std::uint32_t>(time), "again");
     key.insert(0, "=");

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <deque>
@@ -23,6 +24,18 @@ public:
     static constexpr std::size_t kMostEntries = 65536;
     static constexpr EntryId kOthers = 1;
 
+    /// An identity of numbers, which is found without making its words.
+    struct Numbers {
+        ListId list = 0;
+        EntryId outer = kNoEntry;
+        std::size_t count = 0;
+        std::array<std::int64_t, 4> values{};
+        std::array<std::uint32_t, 4> fields{};
+        std::array<const void*, 4> formats{};
+
+        friend bool operator==(const Numbers&, const Numbers&) = default;
+    };
+
     EntryTable();
 
     /// The list under a key of a section or, for a list in a list, of the outer list.
@@ -30,6 +43,9 @@ public:
     /// The entry of that identity ("Physical Cell ID 275"); `outer` is the entry that contains the
     /// list, or kNoEntry.
     EntryId entry(ListId list, EntryId outer, std::string_view identity);
+    /// The entry that was noted for an identity of numbers; kNoEntry: none.
+    EntryId entry(const Numbers& numbers) const;
+    void note(const Numbers& numbers, EntryId entry) { _ofNumbers.emplace(numbers, entry); }
     /// The same entry when it comes for the n-th time in one list, from 2 on.
     EntryId again(EntryId entry, std::size_t time);
 
@@ -39,10 +55,15 @@ public:
     bool isFull() const { return _words.size() >= kMostEntries; }
 
 private:
+    struct Hash {
+        std::size_t operator()(const Numbers& numbers) const;
+    };
+
     EntryId add(std::string key, std::string words);
 
     std::unordered_map<std::string, ListId> _lists;
     std::unordered_map<std::string, EntryId> _entries;
+    std::unordered_map<Numbers, EntryId, Hash> _ofNumbers;
     std::deque<std::string> _words; ///< by number
 };
 

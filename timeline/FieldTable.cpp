@@ -47,33 +47,40 @@ std::span<const FieldIndex> FieldTable::underKey(std::string_view section,
                                  : std::span<const FieldIndex>();
 }
 
-std::span<const FieldIndex> FieldTable::added(const Sample& sample) {
+std::span<const FieldIndex> FieldTable::ofSeveral(const Sample& sample) {
+    if (sample.id < _rows.size() && !_rows[sample.id].empty()) {
+        return _rows[sample.id];
+    }
     if (!_isObjectStream || sample.id >= kMostPaths) {
         return {};
-    }
-    if (sample.id >= _rows.size()) {
-        _rows.resize(sample.id + std::size_t{1});
     }
     const auto found = _byPath.find(std::string(sample.field.key));
     const FieldIndex index =
         found != _byPath.end() ? found->second : add(infoOfPath(sample.field.key));
-    _rows[sample.id] = {index};
+    addToRow(sample.id, index);
     return _rows[sample.id];
+}
+
+void FieldTable::addToRow(FieldId row, FieldIndex index) {
+    if (row >= _rows.size()) {
+        _rows.resize(row + std::size_t{1});
+        _single.resize(_rows.size(), kSeveral);
+    }
+    _rows[row].push_back(index);
+    _single[row] = _rows[row].size() == 1 ? index : kSeveral;
 }
 
 FieldIndex FieldTable::add(FieldInfo info) {
     const auto index = static_cast<FieldIndex>(_fields.size());
     for (const FieldId row : info.rows) {
-        if (row >= _rows.size()) {
-            _rows.resize(row + std::size_t{1});
-        }
-        _rows[row].push_back(index);
+        addToRow(row, index);
     }
     _byName.emplace(info.name, index);
     _byPath.emplace(info.path, index);
     if (!info.isInList) {
         _byKey[keyIn(info.section, info.key)].push_back(index);
     }
+    _identifies.push_back(info.identifies);
     _fields.push_back(std::move(info));
     return index;
 }

@@ -42,26 +42,31 @@ public:
 
     /// The fields that show a sample: usually one; of CDMA, one for each place.
     std::span<const FieldIndex> of(const Sample& sample) {
-        if (sample.id < _rows.size() && !_rows[sample.id].empty()) {
-            return _rows[sample.id];
+        if (sample.id < _single.size() && _single[sample.id] != kSeveral) {
+            return {&_single[sample.id], 1};
         }
-        return added(sample);
+        return ofSeveral(sample);
     }
     /// The fields outside lists under that key of a section; of an object stream, at that path.
     std::span<const FieldIndex> underKey(std::string_view section, std::string_view key) const;
 
     /// Whether the field is part of the identity of its list's entries.
-    bool identifies(FieldIndex index) const { return _fields[index].identifies; }
+    bool identifies(FieldIndex index) const { return _identifies[index]; }
 
 private:
-    std::span<const FieldIndex> added(const Sample& sample);
+    static constexpr auto kSeveral = static_cast<FieldIndex>(-1); ///< or none, or not known yet
+
+    std::span<const FieldIndex> ofSeveral(const Sample& sample);
+    void addToRow(FieldId row, FieldIndex index);
     FieldIndex add(FieldInfo info);
     FieldInfo infoOfPath(std::string_view path) const;
 
     std::string _technology;
     bool _isObjectStream = false;
     std::deque<FieldInfo> _fields;
+    std::vector<bool> _identifies;
     std::vector<std::vector<FieldIndex>> _rows; ///< by the number of the row or path
+    std::vector<FieldIndex> _single;            ///< the only one of a row: it is asked for often
     std::unordered_map<std::string, FieldIndex> _byName;
     std::unordered_map<std::string, FieldIndex> _byPath;
     std::unordered_map<std::string, std::vector<FieldIndex>> _byKey; ///< "section\nkey"

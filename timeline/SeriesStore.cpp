@@ -19,11 +19,6 @@ SeriesValue numberOnly(const SeriesValue& value) {
     return value.isNumber() ? value : SeriesValue();
 }
 
-std::uint64_t keyOf(FieldIndex field, EntryId entry) {
-    constexpr unsigned kHalf = 32;
-    return std::uint64_t{field} << kHalf | entry;
-}
-
 } // namespace
 
 void Bucket::add(const SeriesValue& value) {
@@ -87,33 +82,49 @@ void SeriesStore::beginPacket(std::uint64_t number, Time time) {
 }
 
 void SeriesStore::add(FieldIndex field, EntryId entry, const FieldValue& value) {
-    if (Series* series = seriesOf(field, entry)) {
-        add(*series, valueOf(value));
+    Series* series = seriesOf(field, entry);
+    if (series == nullptr) {
+        return;
     }
+    const Text* text = std::isnan(value.number) ? value.shown.text() : nullptr;
+    if (text != nullptr && !series->runs.empty()) {
+        const SeriesValue latest = series->runs.back().last;
+        if (latest.text() != 0 && _texts.text(latest.text()) == text->view()) {
+            return add(*series, latest); // most texts come again, and need not be looked up
+        }
+    }
+    add(*series, valueOf(value));
+}
+
+const SeriesStore::Series* SeriesStore::find(FieldIndex field, EntryId entry) const {
+    if (entry == kNoEntry) {
+        return field < _plain.size() ? _plain[field] : nullptr;
+    }
+    if (entry >= _ofEntries.size()) {
+        return nullptr;
+    }
+    for (const OfEntry& each : _ofEntries[entry]) { // there are only a few
+        if (each.field == field) {
+            return each.series;
+        }
+    }
+    return nullptr;
 }
 
 SeriesStore::Series* SeriesStore::seriesOf(FieldIndex field, EntryId entry) {
-    if (entry == kNoEntry && field < _plain.size() && _plain[field] != nullptr) {
-        return _plain[field];
-    }
-    if (entry != kNoEntry) {
-        const auto found = _ofEntries.find(keyOf(field, entry));
-        if (found != _ofEntries.end()) {
-            return found->second;
-        }
+    if (const Series* found = find(field, entry)) {
+        return const_cast<Series*>(found); // NOLINT(cppcoreguidelines-pro-type-const-cast): ours
     }
     if (_isFull || _series.size() >= _limits.series || entry == EntryTable::kOthers) {
         _isFull = true;
         return nullptr;
     }
     Series& series = _series.emplace_back();
-    series.entry = entry;
     if (entry != kNoEntry) {
-        _ofEntries.emplace(keyOf(field, entry), &series);
+        _ofEntries.resize(std::max(_ofEntries.size(), entry + std::size_t{1}));
+        _ofEntries[entry].push_back({field, &series});
     } else {
-        if (field >= _plain.size()) {
-            _plain.resize(field + std::size_t{1});
-        }
+        _plain.resize(std::max(_plain.size(), field + std::size_t{1}));
         _plain[field] = &series;
     }
     return &series;
@@ -207,12 +218,7 @@ std::vector<Bucket> SeriesStore::buckets(FieldIndex field, EntryId entry,
     for (std::size_t index = 0; index + 1 < borders.size(); ++index) {
         buckets.push_back({borders[index], borders[index + 1], cellTime(borders[index])});
     }
-    const Series* series = nullptr;
-    if (entry == kNoEntry) {
-        series = field < _plain.size() ? _plain[field] : nullptr;
-    } else if (const auto found = _ofEntries.find(keyOf(field, entry)); found != _ofEntries.end()) {
-        series = found->second;
-    }
+    const Series* series = find(field, entry);
     if (series == nullptr) {
         return buckets;
     }
@@ -232,12 +238,11 @@ std::vector<Bucket> SeriesStore::buckets(FieldIndex field, EntryId entry,
 
 std::vector<EntryId> SeriesStore::entriesOf(FieldIndex field) const {
     std::vector<EntryId> entries;
-    for (const auto& [key, series] : _ofEntries) {
-        if (key >> 32U == field) {
-            entries.push_back(series->entry);
+    for (EntryId entry = 1; entry < _ofEntries.size(); ++entry) {
+        if (find(field, entry) != nullptr) {
+            entries.push_back(entry);
         }
     }
-    std::sort(entries.begin(), entries.end());
     return entries;
 }
 

@@ -136,11 +136,16 @@ private:
         }
     };
     struct Series {
-        EntryId entry = kNoEntry;
         std::vector<Run> runs;
     };
 
+    struct OfEntry {
+        FieldIndex field;
+        Series* series;
+    };
+
     Series* seriesOf(FieldIndex field, EntryId entry);
+    const Series* find(FieldIndex field, EntryId entry) const;
     void add(Series& series, const SeriesValue& value);
     static void appendMerged(std::vector<Run>& runs, Run run);
     void halveCells();
@@ -151,8 +156,8 @@ private:
     std::uint32_t _cell = 0;
     std::vector<Time> _times; ///< of the cells' first packets
     std::deque<Series> _series;
-    std::vector<Series*> _plain; ///< by field: outside lists
-    std::unordered_map<std::uint64_t, Series*> _ofEntries;
+    std::vector<Series*> _plain;                  ///< by field: outside lists
+    std::vector<std::vector<OfEntry>> _ofEntries; ///< by entry
     std::size_t _runCount = 0;
     bool _isFull = false;
 };

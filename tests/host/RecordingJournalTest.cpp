@@ -72,7 +72,8 @@ TEST_F(RecordingJournalTest, GivesThePacketsFromAnyNumberOn) {
     EXPECT_EQ(readAll(*journal->reader(5000), 5000), kCount - 4999) << "before anything is noted";
     expectAnyStart(*journal);
     EXPECT_EQ(journal->trouble(), std::nullopt);
-    EXPECT_EQ(journal->share(), 1.0);
+    EXPECT_GT(journal->share(), 0.7) << "two of the 10,000 packets are noted";
+    EXPECT_LT(journal->share(), 1.0);
 }
 
 TEST_F(RecordingJournalTest, ReadersAreIndependentOfEachOther) {

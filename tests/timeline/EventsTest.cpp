@@ -68,11 +68,10 @@ TEST_F(EventsTest, TheSameIdentityOnAnotherChannelIsAnotherCell) {
 TEST_F(EventsTest, AChannelThatIsNoLongerToldIsNoOtherCell) {
     use("gsm");
     const auto cell = [](int code) { // the telephony service's list and the modem's own record
-        return Record(0xFF0001).append(*serializeBinary(
-            Array{Dictionary{{"kHXCellMonitorCellType", "kHXCellMonitorCellTypeServing"},
-                             {"kHXCellMonitorCellRadioAccessTechnology",
-                              "kHXCellMonitorCellRadioAccessTechnologyGSM"},
-                             {"kHXCellMonitorARFCN", PropertyList::integer(code)}}}));
+        return Record(0xFF0001).append(*serializeBinary(Array{Dictionary{
+            {"kHXCellMonitorCellType", "kHXCellMonitorCellTypeServing"},
+            {"kHXCellMonitorCellRadioAccessTechnology", "kHXCellMonitorRadioAccessTechnologyGSM"},
+            {"kHXCellMonitorARFCN", PropertyList::integer(code)}}}));
     };
     add(0, cell(62));
     add(20, Record(0x5134).u16(62).u16(18).u16(1).padTo(26));
@@ -175,8 +174,9 @@ TEST_F(EventsTest, EveryFieldOfTheTableExistsAndSoDoItsLabels) {
         for (const std::string_view name : row.fields) {
             ASSERT_TRUE(fields.named(name)) << name;
             const FieldInfo& info = fields[*fields.named(name)];
+            const bool hasLabels = name == row.fields.front();
             for (const auto labels : {row.good, row.bad}) {
-                for (const std::string_view label : labels) {
+                for (const std::string_view label : hasLabels ? labels : decltype(labels)()) {
                     EXPECT_NE(std::find(info.labels.begin(), info.labels.end(), label),
                               info.labels.end())
                         << name << " is never " << label;
