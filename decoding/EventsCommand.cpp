@@ -169,6 +169,10 @@ ExitStatus EventsCommand::tellEvents(Recording& recording, const RecordedTechnol
 }
 
 ExitStatus runEvents(const EventsOptions& options) {
+    if (const auto loss = outputIntoRecording(options.recordings)) {
+        complain(*loss);
+        return kExitFailure;
+    }
     const RequiredTemplates resources(DirectoryResources::programFolder());
     const BuildBundle bundle;
     const WallClock zone;

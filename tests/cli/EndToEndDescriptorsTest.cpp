@@ -58,7 +58,8 @@ TEST_F(EndToEndDescriptors, AClosedStandardOutputIsNoSuccessAndNoRecordingIsWrit
           "PALLAX decode gsm-attach.pcap a.pcap --jobs 2 >&- 2>err", "PALLAX fields >&- 2>err",
           "PALLAX fields --json >&- 2>err", "PALLAX info gsm-attach.pcap >&- 2>err",
           "PALLAX explain earfcn 1850 >&- 2>err", "PALLAX sql gsm-attach.pcap 'select 1' >&- 2>err",
-          "PALLAX --help >&- 2>err", "PALLAX a.pcap --print >&- 2>err"}) {
+          "PALLAX events a.pcap >&- 2>err", "PALLAX --help >&- 2>err",
+          "PALLAX a.pcap --print >&- 2>err"}) {
         EXPECT_EQ(shell(line), 1) << line;
         EXPECT_EQ(contentOf(world.path("err")), sentence) << line;
         EXPECT_EQ(contentOf(world.path("gsm-attach.pcap")), content);

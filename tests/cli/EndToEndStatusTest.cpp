@@ -186,15 +186,20 @@ TEST_F(EndToEndStatus, OfInfo) {
 }
 
 TEST_F(EndToEndStatus, OfEvents) {
-    const std::string drive = world.path("drive.pcap");
-    ends({{"simulate", "gsm", "--seconds", "60", "-o", drive}, 0, ""});
+    const std::string path = fatal();
+    const std::string drive = PALLAX_SOURCE_DIR "/samples/lte-drive.pcap";
     ends({{"events", drive}, 0, ""});
+    ends({{"events", missing}, 1, isMissing});
     ends({{"events", "--json", drive},
           1,
           "pallax: Standard output cannot be written: No space left on device.\n",
           "/dev/null",
           "/dev/full"});
     ends({{"events"}, 2, "pallax: RECORDING is required (see pallax events --help)\n"});
+    ends({{"events", path},
+          70,
+          "pallax: " + path + ": packet 2 cannot be read; the events end there.\n"});
+    expectEveryDocumentedStatus({"events"});
 }
 
 TEST_F(EndToEndStatus, OfExplain) {

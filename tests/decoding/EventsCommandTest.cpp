@@ -1,0 +1,136 @@
+#include "decoding/EventsCommand.h"
+
+#include "LogGenerator/Technologies/Technologies.h"
+#include "decoding/DroppedNotices.h"
+#include "decoding/RequiredTemplates.h"
+#include "tests/decoding/ScriptedRadio.h"
+#include "tests/doubles/FakeBundle.h"
+#include "tests/doubles/ManualClock.h"
+#include "tests/doubles/RecordBuilder.h"
+
+#include <gtest/gtest.h>
+
+#include <map>
+
+namespace pallax {
+namespace {
+
+using doubles::Record;
+using doubles::ScriptedRecording;
+using std::chrono::seconds;
+using Packets = std::vector<ScriptedRecording::Packet>;
+
+std::string textOf(const ByteBuffer& bytes) {
+    return {bytes.begin(), bytes.end()};
+}
+
+/// Another serving cell, so many seconds after the first packet.
+ScriptedRecording::Packet cell(int second, std::uint16_t pci) {
+    return {seconds(second), textOf(Record(0xB0C2).padTo(14).u16(pci).u16(1850).padTo(38).bytes())};
+}
+
+class EventsCommandTest : public testing::Test {
+protected:
+    void add(const std::string& name, Packets packets, const char* technology = "lte",
+             std::optional<RecordingError> atEnd = std::nullopt) {
+        options.recordings.push_back(name);
+        recordings[name] = std::make_unique<ScriptedRecording>(
+            name, std::move(packets), technologyOfCommandName(technology), std::move(atEnd));
+    }
+
+    ExitStatus run() {
+        const auto open = [this](const std::string& path) -> Recording::OpenResult {
+            const auto found = recordings.find(path);
+            if (found == recordings.end()) {
+                return RecordingError{RecordingError::Kind::CannotOpen, path + " is not there"};
+            }
+            return std::move(found->second);
+        };
+        const auto report = [this](std::string_view sentence) { reports.emplace_back(sentence); };
+        Output output([this](std::string_view block) {
+            written += block;
+            blocks.emplace_back(block);
+        });
+        return EventsCommand(options, {resources, bundle, notices, technologies()}, open, report,
+                             zone)
+            .run(output);
+    }
+
+    EventsOptions options;
+    std::map<std::string, std::unique_ptr<Recording>> recordings;
+    std::string written;
+    std::vector<std::string> blocks;
+    std::vector<std::string> reports;
+    DirectoryResources resources{PALLAX_SOURCE_DIR "/resources"};
+    doubles::FakeBundle bundle;
+    DroppedNotices notices;
+    doubles::ManualClock zone;
+};
+
+TEST_F(EventsCommandTest, ALineHasTheLocalTimeTheKindAndTheWords) {
+    zone.setZone({std::chrono::hours(1), false});
+    add("a.pcap", {cell(0, 150), cell(31, 182), cell(35, 150)});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written,
+              "2023-11-14 23:13:51.000  cell-change       serving cell 150 → 182 after 31 s\n"
+              "2023-11-14 23:13:55.000  ping-pong         serving cell 182 → 150 after 4 s "
+              "(ping-pong)\n");
+    EXPECT_TRUE(reports.empty());
+}
+
+TEST_F(EventsCommandTest, JsonHasThePacketAndTheFields) {
+    options.json = true;
+    add("a.pcap", {cell(0, 150), cell(31, 182)});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, R"({"recording":"a.pcap","time":"2023-11-14T22:13:51.000Z","packet":2,)"
+                       R"("kind":"cell-change","words":"serving cell 150 → 182 after 31 s",)"
+                       R"("fields":["lte.serving_cell_info.physical_cell_id",)"
+                       R"("lte.serving_cell_info.download_frequency"]})"
+                       "\n");
+}
+
+TEST_F(EventsCommandTest, OfSeveralRecordingsEachLineNamesItsOwnAndOneThatFailsStopsNoOther) {
+    add("a.pcap", {cell(0, 1), cell(100, 2)});
+    options.recordings.emplace_back("missing.pcap");
+    add("b.pcap", {cell(0, 3), cell(20, 4)}, "lte",
+        RecordingError{RecordingError::Kind::CutShort, "b.pcap ends in the middle of a packet."});
+    EXPECT_EQ(run(), kExitFailure);
+    EXPECT_EQ(written,
+              "a.pcap: 2023-11-14 22:15:00.000  gap               no packets for 100.0 s\n"
+              "a.pcap: 2023-11-14 22:15:00.000  cell-change       serving cell 1 → 2 after 100 s\n"
+              "b.pcap: 2023-11-14 22:13:40.000  cell-change       serving cell 3 → 4 after 20 s\n");
+    EXPECT_EQ(reports, (std::vector<std::string>{"missing.pcap is not there",
+                                                 "b.pcap ends in the middle of a packet."}));
+}
+
+TEST_F(EventsCommandTest, AFatalRecordIsTheLastEventOfItsRecording) {
+    const std::string unreadable = textOf(Record(0xFF0000).u8(1).bytes());
+    add("a.pcap", {cell(0, 1), {seconds(1), unreadable}, cell(2, 2)});
+    EXPECT_EQ(run(), kExitFatalRecord);
+    EXPECT_EQ(written, "2023-11-14 22:13:21.000  fatal-record      fatal record: the embedded "
+                       "property list cannot be parsed\n");
+    EXPECT_EQ(reports,
+              std::vector<std::string>{"a.pcap: packet 2 cannot be read; the events end there."});
+}
+
+TEST_F(EventsCommandTest, ATechnologyThatIsNamedOverridesTheLinkType) {
+    add("a.pcap", {cell(0, 1), cell(9, 2)}, "gsm");
+    options.technology = technologyOfCommandName("lte");
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_NE(written.find("serving cell 1 → 2"), std::string::npos);
+}
+
+TEST_F(EventsCommandTest, AForeignLinkTypeIsAnError) {
+    add("a.pcap", {cell(0, 1)}, "umts");
+    EXPECT_EQ(run(), kExitFailure);
+    EXPECT_EQ(reports, std::vector<std::string>{"a.pcap has a foreign link type"});
+}
+
+TEST_F(EventsCommandTest, EventsOfAStreamAreWrittenWhenTheyHappen) {
+    add("a.pcap", {cell(0, 1), cell(20, 2), cell(40, 3)});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(blocks.size(), 2U); // a scripted recording has no position, like a pipe
+}
+
+} // namespace
+} // namespace pallax
