@@ -30,21 +30,27 @@ struct Question {
     std::string query;
 };
 
-/// The wrong usage, as a sentence, or the question.
-Result<Question, std::string> questionOf(const SqlOptions& options) {
+/// Why there is no question.
+struct Refusal {
+    std::string sentence;
+    ExitStatus status;
+};
+
+Result<Question, Refusal> questionOf(const SqlOptions& options) {
     Question question{options.words, {}};
     if (options.file) {
         std::ifstream file(*options.file, std::ios::binary);
         question.query.assign(std::istreambuf_iterator<char>(file), {});
         if (!file) {
-            return formatText("%@ cannot be read.", {*options.file});
+            return Refusal{formatText("%@ cannot be read.", {*options.file}), kExitFailure};
         }
     } else if (!question.recordings.empty()) {
         question.query = std::move(question.recordings.back());
         question.recordings.pop_back();
     }
     if (question.recordings.empty()) {
-        return std::string("sql takes recordings and then a query (see pallax sql --help)");
+        return Refusal{"sql takes recordings and then a query (see pallax sql --help)",
+                       kExitWrongUsage};
     }
     return question;
 }
@@ -109,8 +115,8 @@ std::string queryErrorText(const QueryError& error, const std::string& query,
 ExitStatus runSql(const SqlOptions& options) {
     const auto question = questionOf(options);
     if (!question) {
-        complain(question.error());
-        return kExitWrongUsage;
+        complain(question.error().sentence);
+        return question.error().status;
     }
     const RequiredTemplates resources(DirectoryResources::programFolder());
     const BuildBundle bundle;

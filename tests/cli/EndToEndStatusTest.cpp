@@ -227,6 +227,25 @@ TEST_F(EndToEndStatus, OfSnapshot) {
     expectEveryDocumentedStatus({"snapshot"});
 }
 
+TEST_F(EndToEndStatus, OfSql) {
+    ends({{"sql", sample, "select count(*) from packet"}, 0, ""});
+    ends({{"sql", missing, "select 1"}, 1, isMissing});
+    ends({{"sql", sample, "select 1"},
+          1,
+          "pallax: Standard output cannot be written: No space left on device.\n",
+          "/dev/null",
+          "/dev/full"});
+    ends({{"sql", sample},
+          2,
+          "pallax: sql takes recordings and then a query (see pallax sql --help)\n"});
+    ends({{"sql", sample, "select tme from packet"},
+          2,
+          "pallax: no such column: tme. Did you mean \"time\"? (line 1, column 8 of the query)\n"});
+    ends({{"sql", sample, "drop table packet"}, 2, "pallax: A query can only read.\n"});
+    ends({{"sql", "--file", missing, sample}, 1, "pallax: " + missing + " cannot be read.\n"});
+    expectEveryDocumentedStatus({"sql"});
+}
+
 TEST_F(EndToEndStatus, OfTheTextsForPackages) {
     const std::string full =
         "pallax: Standard output cannot be written: No space left on device.\n";

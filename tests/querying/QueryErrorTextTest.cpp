@@ -1,0 +1,30 @@
+#include "querying/SqlCommand.h"
+
+#include <gtest/gtest.h>
+
+namespace pallax {
+namespace {
+
+const std::vector<std::string> kNames = {"state", "measured_rsrp", "band"};
+
+TEST(QueryErrorText, SuggestsANameAndTellsThePlace) {
+    EXPECT_EQ(queryErrorText({"no such column: measured_rspr", 7}, "select measured_rspr", kNames),
+              "no such column: measured_rspr. Did you mean \"measured_rsrp\"? (line 1, column 8 of "
+              "the query)");
+    EXPECT_EQ(queryErrorText({"no such column: s.measured_rspr", {}}, "", kNames),
+              "no such column: s.measured_rspr. Did you mean \"measured_rsrp\"?");
+    EXPECT_EQ(queryErrorText({"no such table: stat", {}}, "", kNames),
+              "no such table: stat. Did you mean \"state\"?");
+    EXPECT_EQ(queryErrorText({"no such column: quite_another", {}}, "", kNames),
+              "no such column: quite_another");
+}
+
+TEST(QueryErrorText, CountsLines) {
+    EXPECT_EQ(queryErrorText({"near \"x\": syntax error", 11}, "select 1\n, x y", kNames),
+              "near \"x\": syntax error (line 2, column 3 of the query)");
+    EXPECT_EQ(queryErrorText({"e", 0}, "x", kNames), "e (line 1, column 1 of the query)");
+    EXPECT_EQ(queryErrorText({"e", 2}, "x", kNames), "e") << "no such place";
+}
+
+} // namespace
+} // namespace pallax
