@@ -44,6 +44,7 @@ Recording::OpenResult JoinedRecording::open(const std::vector<std::string>& path
     std::stable_sort(parts.begin(), parts.end(),
                      [](const Part& one, const Part& other) { return one.first < other.first; });
     std::vector<std::string> ordered;
+    ordered.reserve(parts.size());
     for (const Part& part : parts) {
         ordered.push_back(part.path);
     }

@@ -111,7 +111,10 @@ std::uint64_t RecordingSummary::unknown() const {
 }
 
 std::vector<bool> RecordingSummary::filled() const {
-    std::vector<bool> filled(_codes != nullptr ? _codes->sections().size() : 0);
+    if (_codes == nullptr) {
+        return {};
+    }
+    std::vector<bool> filled(_codes->sections().size());
     for (const auto& [code, count] : _counts) {
         const auto* known = _codes->find(code);
         if (known == nullptr || count.damaged == count.packets) {
