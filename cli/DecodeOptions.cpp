@@ -96,7 +96,8 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
     app.add_flag("--join", options.join, "The recordings are one, in the order of their times");
     app.add_flag("--strict", options.strict,
                  "Exit with status 70 at a record that cannot be read instead of skipping it");
-    app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng) and saved snapshots")
+    app.add_option("RECORDING", options.recordings,
+                   "Recordings (pcap or pcapng) and saved snapshots")
         ->required()
         ->type_name("");
     app.footer(kDecodeFooter);
