@@ -136,9 +136,9 @@ int main(int argc, char** argv) {
         return 2;
     }
     constexpr long kSeeks = 1000;
-    constexpr int kDecimal = 10;
+    constexpr int kBase = 10;
     const std::string path = argv[1];
-    const long seeks = argc == 3 ? std::strtol(argv[2], nullptr, kDecimal) : kSeeks;
+    const long seeks = argc == 3 ? std::strtol(argv[2], nullptr, kBase) : kSeeks;
     const DirectoryResources resources(DirectoryResources::programFolder());
     const BuildBundle bundle;
     const auto journal = RecordingJournal::open(path);

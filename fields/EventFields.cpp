@@ -56,6 +56,7 @@ constexpr std::array<Names, 5> kMmNoService{"MM_NULL_SUBSTATE", "MM_NO_IMSI", "M
 constexpr std::array<Names, 3> kGmmRegistered{"GMM_REGISTERED", "GMM_ROUTING_AREA_UPDATE_INITIATED",
                                               "GMM_SERVICE_REQUEST_INITIATED"};
 constexpr std::array<Names, 2> kGmmLost{"GMM_NULL", "GMM_DEREGISTERED"};
+constexpr std::array<Names, 2> kOneXIdle{"Paging [6]", "Slotted mode sleep state [7]"};
 constexpr std::array<Names, 3> kOneXService{"Paging [6]", "Slotted mode sleep state [7]",
                                             "Traffic [8]"};
 constexpr std::array<Names, 3> kOneXLost{"Inactive [0]", "Initial state for CDMA operation [2]",
@@ -90,7 +91,7 @@ constexpr auto kRows = std::to_array<EventFields>({
 
     {"cdma", Watch::Cell, "1x serving cell", kOneXCell},
     {"cdma", Watch::Cell, "EV-DO serving cell", kEvdoCell, {}, kNoPilot},
-    {"cdma", Watch::State, "1x", kOneXState},
+    {"cdma", Watch::State, "1x", kOneXState, kOneXIdle},
     {"cdma", Watch::State, "EV-DO", kEvdoState},
     {"cdma", Watch::State, "EV-DO session", kEvdoSession},
     {"cdma", Watch::Service, "1x service", kOneXState, kOneXService, kOneXLost},

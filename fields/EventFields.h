@@ -37,6 +37,7 @@ struct EventFields {
     std::string_view subject; ///< "serving cell", "RRC", "service"
     /// Of a Cell: the first is the one that the words give when it alone tells the cells apart.
     std::span<const std::string_view> fields;
+    /// Of a State: values between which an idle phone changes all the time, without an event.
     /// Of Service: the values of a phone that has it; if there are none, any value.
     std::span<const std::string_view> good = {};
     /// Of a Cell: values of the first field that name none. Of Service: the values of a phone that

@@ -1,8 +1,8 @@
 #pragma once
 
+#include "packets/StampSequence.h"
 #include "text/Bytes.h"
 #include "text/Date.h"
-#include "packets/StampSequence.h"
 
 #include <array>
 #include <cstddef>

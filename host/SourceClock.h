@@ -1,9 +1,9 @@
 #pragma once
 
 #include "host/SourceTimeListener.h"
+#include "packets/StampSequence.h"
 #include "platform/Clock.h"
 #include "platform/RepeatingTimer.h"
-#include "packets/StampSequence.h"
 
 #include <chrono>
 #include <cstdint>

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "text/Date.h"
 #include "packets/StampSequence.h"
+#include "text/Date.h"
 
 #include <cstdint>
 

@@ -1,8 +1,8 @@
 #include "telephony/PacketPlayer.h"
 
+#include "packets/TimeGrid.h"
 #include "platform/MainQueue.h"
 #include "telephony/PacketSink.h"
-#include "packets/TimeGrid.h"
 
 #include <algorithm>
 #include <cmath>

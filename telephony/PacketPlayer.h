@@ -1,10 +1,10 @@
 #pragma once
 
 #include "host/PortFrame.h"
+#include "packets/StampSequence.h"
 #include "sources/CodeFilter.h"
 #include "sources/PacketSource.h"
 #include "text/Date.h"
-#include "packets/StampSequence.h"
 
 #include <chrono>
 #include <functional>

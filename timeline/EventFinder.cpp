@@ -168,7 +168,8 @@ void EventFinder::lookAtState(Row& row, const Moment& moment) {
             add(row, EventKind::TechnologyChange, "technology " + std::string(row.rule->subject),
                 moment);
         }
-    } else if (row.isKnown) {
+    } else if (row.isKnown && !(isAmong(row.rule->good, row.value.front()) &&
+                                isAmong(row.rule->good, state.front()))) {
         std::string words(row.rule->subject);
         words.append(" ").append(row.value.front()).append(kArrow).append(state.front());
         add(row, EventKind::StateChange, std::move(words), moment);

@@ -111,6 +111,20 @@ TEST_F(EventsTest, StatesOfUtran) {
     EXPECT_EQ(events(), (Lines{"5 s state-change: RRC Disconnected → Cell DCH"}));
 }
 
+TEST_F(EventsTest, AnIdlePhoneThatWakesForPagingHasNoEvents) {
+    use("cdma");
+    fixture->drive(4, 300s, 20);
+    (void)events();
+    std::size_t states = 0;
+    for (const Event& event : timeline->events()) {
+        const bool isIdle = event.words == "1x Paging [6] → Slotted mode sleep state [7]" ||
+                            event.words == "1x Slotted mode sleep state [7] → Paging [6]";
+        EXPECT_FALSE(isIdle);
+        states += event.kind == EventKind::StateChange ? 1 : 0;
+    }
+    EXPECT_GT(states, 3U);
+}
+
 TEST_F(EventsTest, ContextsComeAndGo) {
     use("lte");
     add(0, contexts({"ims"}));
