@@ -6,7 +6,7 @@ namespace pallax {
 
 std::size_t KeyFrame::bytes() const {
     constexpr std::size_t kHashNode = 32;
-    std::size_t bytes = sizeof(KeyFrame) + bytesOf(display) + bytesOf(running);
+    std::size_t bytes = sizeof(KeyFrame) + memoryOf(display) + memoryOf(running);
     for (const Record& record : records) {
         bytes += sizeof(Record) + record.times.bytes() + record.remembered.size() * kHashNode;
     }

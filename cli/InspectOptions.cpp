@@ -70,9 +70,8 @@ NULL where the display has a text instead ("Not Present").
 
 Exit status:
   0   success, or the reader of the output has gone
-  1   failure: cannot read a recording or template, or write the output; the
-      recording is damaged or the query was stopped
-  2   wrong usage: an unknown option, or a query that is wrong)";
+  1   failure: cannot read a whole recording or a template, or write the output
+  2   wrong usage, or a wrong query)";
 
 constexpr const char* kSnapshotFooter = R"(Examples:
   pallax snapshot --dlf PallaxSnapshot-1700000000.pallax -o drive.dlf

@@ -67,18 +67,18 @@ void copyInto(const PropertyList& target, const PropertyList& source) {
     entries = std::move(content);
 }
 
-std::size_t bytesOf(const PropertyList& object) {
+std::size_t memoryOf(const PropertyList& object) {
     constexpr std::size_t kControlBlock = 16;
     std::size_t bytes = sizeof(PropertyList);
     if (const DictionaryRef entries = object.dictionary()) {
         bytes += sizeof(Dictionary) + kControlBlock;
         for (const Dictionary::Entry& entry : *entries) {
-            bytes += sizeof(Dictionary::Entry) - sizeof(PropertyList) + bytesOf(entry.value);
+            bytes += sizeof(Dictionary::Entry) - sizeof(PropertyList) + memoryOf(entry.value);
         }
     } else if (const ArrayRef elements = object.array()) {
         bytes += sizeof(Array) + kControlBlock;
         for (const PropertyList& element : *elements) {
-            bytes += bytesOf(element);
+            bytes += memoryOf(element);
         }
     } else if (const Text* text = object.text()) {
         bytes += text->view().size();

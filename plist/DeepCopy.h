@@ -15,6 +15,6 @@ PropertyList deepCopy(const PropertyList& object);
 void copyInto(const PropertyList& target, const PropertyList& source);
 
 /// About how many bytes the object and everything in it takes.
-std::size_t bytesOf(const PropertyList& object);
+std::size_t memoryOf(const PropertyList& object);
 
 } // namespace pallax

@@ -53,13 +53,13 @@ const FieldValue* CurrentValues::value(std::string_view fieldName) const {
 std::size_t CurrentValues::bytes() const {
     std::size_t bytes = sizeof(CurrentValues);
     for (const FieldValue& value : _values) {
-        bytes += sizeof(value) - sizeof(value.shown) + bytesOf(value.shown);
+        bytes += sizeof(value) - sizeof(value.shown) + memoryOf(value.shown);
     }
     for (const List& list : _lists) {
         for (const Slot& slot : list.slots) {
             bytes += sizeof(Slot);
             for (const auto& [field, value] : slot.held.values) {
-                bytes += sizeof(value) - sizeof(value.shown) + sizeof(field) + bytesOf(value.shown);
+                bytes += sizeof(value) - sizeof(value.shown) + sizeof(field) + memoryOf(value.shown);
             }
         }
     }

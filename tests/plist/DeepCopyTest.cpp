@@ -51,8 +51,8 @@ TEST(DeepCopy, IntoAnObjectOfAnotherKindDoesNothing) {
 }
 
 TEST(DeepCopy, TheSizeGrowsWithTheContent) {
-    EXPECT_GT(bytesOf(picture()), bytesOf(Dictionary{{"Text", "shown"}}));
-    EXPECT_GT(bytesOf(PropertyList(std::string(1000, 'x'))), 1000U);
+    EXPECT_GT(memoryOf(picture()), memoryOf(Dictionary{{"Text", "shown"}}));
+    EXPECT_GT(memoryOf(PropertyList(std::string(1000, 'x'))), 1000U);
 }
 
 } // namespace
