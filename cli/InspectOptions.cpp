@@ -112,8 +112,8 @@ void addSql(CLI::App& app, SqlOptions& options) {
         {{"table", RowFormat::Table}, {"csv", RowFormat::Csv}, {"json", RowFormat::Json}},
         "A table, CSV, or JSON, one object per row (default: table)");
     app.add_option("--file", options.file, "Read the query from this file")->type_name("FILE");
-    app.add_option("RECORDING... QUERY", options.words,
-                   "Recordings (pcap or pcapng), and the query unless it is in a file")
+    app.add_option("RECORDING", options.words,
+                   "Recordings (pcap or pcapng); then, unless it is in a file, the query")
         ->required()
         ->type_name("");
     app.footer(kSqlFooter);

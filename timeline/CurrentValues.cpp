@@ -59,7 +59,8 @@ std::size_t CurrentValues::bytes() const {
         for (const Slot& slot : list.slots) {
             bytes += sizeof(Slot);
             for (const auto& [field, value] : slot.held.values) {
-                bytes += sizeof(value) - sizeof(value.shown) + sizeof(field) + memoryOf(value.shown);
+                bytes +=
+                    sizeof(value) - sizeof(value.shown) + sizeof(field) + memoryOf(value.shown);
             }
         }
     }
