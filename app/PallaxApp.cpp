@@ -117,18 +117,18 @@ void PallaxApp::showSaveView() {
     if (_saveViewController) {
         return;
     }
+    PallaxSaveViewController::Surroundings surroundings{
+        .toolkit = _surroundings.toolkit,
+        .files = _surroundings.files,
+        .clock = _surroundings.clock,
+        .present = _surroundings.present,
+        .queue = _surroundings.queue,
+        .snapshotDirectory = _surroundings.snapshotDirectory,
+        .closeSaveView = whileAlive(&PallaxApp::closeSaveView),
+        .bringUpToDate = whileAlive(&PallaxApp::bringUpToDate),
+    };
     setSaveViewController(std::make_shared<PallaxSaveViewController>(
-        PallaxSaveViewController::Surroundings{
-            .toolkit = _surroundings.toolkit,
-            .files = _surroundings.files,
-            .clock = _surroundings.clock,
-            .present = _surroundings.present,
-            .queue = _surroundings.queue,
-            .snapshotDirectory = _surroundings.snapshotDirectory,
-            .closeSaveView = whileAlive(&PallaxApp::closeSaveView),
-            .bringUpToDate = whileAlive(&PallaxApp::bringUpToDate),
-        },
-        _model ? _model->getSaveContents() : PropertyList()));
+        std::move(surroundings), _model ? _model->getSaveContents() : PropertyList()));
     if (_navController) {
         _navController->presentModal(_saveViewController, true);
     }

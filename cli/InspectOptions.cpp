@@ -26,8 +26,8 @@ if its log type is neither 1 nor 255, or if its length is refused by every
 section that reads its log code; a message of an object stream, if it is empty.
 Contents are not checked.
 
-Of a saved snapshot, its displays and the size of its DLF log are told. Displays
-that share a section all show it as it was when the snapshot was saved.
+For a saved snapshot, the displays and the size of the DLF log are listed.
+Displays that share a section all show it as it was when the snapshot was saved.
 
 "fills" names the sections that the recording has data for.
 A file that is cut or damaged is described as far as it can be read.

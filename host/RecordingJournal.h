@@ -13,8 +13,8 @@
 namespace pallax {
 
 /// A recording in a regular file, which is its own journal: readers begin at places in the file
-/// that were noted when it was read first. What is done to the file meanwhile is told and ends the
-/// reading at worst.
+/// that were noted when it was read first. If the file changes meanwhile, `trouble` says how;
+/// reading may end early.
 class RecordingJournal final : public PacketJournal {
 public:
     /// Errors as for Recording. For a stream, and for a file that cannot be read from the middle,

@@ -9,7 +9,7 @@ namespace pallax {
 /// A copy that shares no container with `object`.
 PropertyList deepCopy(const PropertyList& object);
 
-/// Gives the containers of `target` the content of `source` without replacing them: whoever shares
+/// Gives the containers of `target` the content of `source` without replacing them: what shares
 /// a container of `target` sees the new content. Shares no container with `source`. Both must be
 /// of the same kind, else nothing happens.
 void copyInto(const PropertyList& target, const PropertyList& source);

@@ -50,8 +50,8 @@ private:
     std::vector<std::string> _columns;
 };
 
-/// Tables to be asked in SQL. Queries can only read: whatever would write, attach a file, load an
-/// extension or set something is refused.
+/// Tables that answer queries in SQL. Queries can only read; they cannot write,
+/// attach a file, load an extension or change a setting.
 class Database {
 public:
     /// Throws std::runtime_error without memory.

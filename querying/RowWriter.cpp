@@ -41,7 +41,7 @@ std::string textOf(const QueryValue& value) {
 }
 
 std::size_t columnsOf(std::string_view text) {
-    // A table is for people: a letter counts as one, whatever its width.
+    // A table is for people: each letter counts as one column.
     return static_cast<std::size_t>(std::count_if(text.begin(), text.end(), [](char character) {
         constexpr unsigned kContinuation = 0xC0;
         return (static_cast<unsigned char>(character) & kContinuation) != 0x80U;

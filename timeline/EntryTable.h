@@ -20,7 +20,7 @@ inline constexpr EntryId kNoEntry = 0;
 /// The lists and entries that were seen, with a number for each.
 class EntryTable {
 public:
-    /// The most entries that are told apart. Further ones are all the entry `kOthers`.
+    /// The most entries with a number of their own. Further ones are all the entry `kOthers`.
     static constexpr std::size_t kMostEntries = 65536;
     static constexpr EntryId kOthers = 1;
 

@@ -47,7 +47,7 @@ public:
         return packets >= _limits.distance || bytes >= _limits.distanceInBytes;
     }
     void add(TimelineKeyFrame keyFrame);
-    /// Removes those of packets before the one before `packet`: nobody can go on from them.
+    /// Removes those from which decoding cannot go on without the packets before `packet`.
     void dropBefore(std::uint64_t packet);
 
     /// The latest key frame that contains no packet after `packet`, or null.

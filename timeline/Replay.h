@@ -17,7 +17,7 @@ namespace pallax {
 
 struct RecordedTechnology;
 
-/// What decoding a recording needs. All must outlive whoever uses it.
+/// What decoding a recording needs. All must outlive its users.
 struct DecodingSource {
     const RecordedTechnology& technology;
     const Resources& resources;
