@@ -3,11 +3,15 @@
 #include "console/Output.h"
 #include "decoding/Preconditions.h"
 #include "host/Complaint.h"
+#include "host/Descriptor.h"
 #include "host/Files.h"
 #include "host/Snapshot.h"
 #include "plist/PropertyListCodec.h"
 #include "text/Format.h"
 
+#include <fcntl.h>
+#include <filesystem>
+#include <system_error>
 #include <unistd.h>
 
 namespace pallax {
@@ -24,8 +28,19 @@ ExitStatus write(const std::string& output, std::string_view content) {
         writeToDescriptor(STDOUT_FILENO, "Standard output")(content);
         return kExitSuccess;
     }
-    return replaceFile(output, content) ? kExitSuccess
-                                        : failed(formatText("%@ cannot be written.", {output}));
+    std::error_code error;
+    const auto status = std::filesystem::status(output, error);
+    if (std::filesystem::exists(status) && !std::filesystem::is_regular_file(status)) {
+        // Renaming a file would replace a device or a pipe, which is written to.
+        const Descriptor file(::open(output.c_str(), O_WRONLY | O_CLOEXEC));
+        if (file) {
+            writeToDescriptor(file.number(), output)(content);
+            return kExitSuccess;
+        }
+    } else if (replaceFile(output, content)) {
+        return kExitSuccess;
+    }
+    return failed(formatText("%@ cannot be written.", {output}));
 }
 
 } // namespace

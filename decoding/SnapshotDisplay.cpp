@@ -28,7 +28,7 @@ public:
     }
 
 private:
-    void addTo(Dictionary& all, const Dictionary& message, const PropertyList& display);
+    void addDisplayTo(Dictionary& all, const Dictionary& message, const PropertyList& display);
 
     SnapshotDisplays _displays;
 };
@@ -51,12 +51,12 @@ void SnapshotGenerator::updateState(Dictionary& state, Bytes data) {
     }
     const DictionaryRef before = valueAt(state, "Display").dictionary();
     Dictionary all = before ? *before : Dictionary();
-    addTo(all, *message, content);
+    addDisplayTo(all, *message, content);
     state.setFixed("Display", std::move(all));
 }
 
-void SnapshotGenerator::addTo(Dictionary& all, const Dictionary& message,
-                              const PropertyList& display) {
+void SnapshotGenerator::addDisplayTo(Dictionary& all, const Dictionary& message,
+                                     const PropertyList& display) {
     if (all.empty()) {
         all.setFixed("Snapshot", Dictionary{{"Saved", valueAt(message, kSnapshotSaved)},
                                             {"Description", valueAt(message, kSnapshotDescription)},

@@ -11,6 +11,8 @@ namespace pallax {
 
 namespace {
 
+constexpr std::uint64_t kPacketsBetweenCalls = 1024;
+
 struct OpenJournal {
     std::unique_ptr<PacketJournal> journal;
     const RecordedTechnology* technology = nullptr; ///< of the link type; null if it is unknown
@@ -42,16 +44,17 @@ OpenResult openFile(const std::string& path) {
 }
 
 /// Reads a source that cannot be read again, or not in one piece.
-OpenResult keep(const std::vector<std::string>& paths, const MayContinue& mayContinue) {
-    const auto recording = openRecordings(paths);
+OpenResult keep(const RecordedTimeline::Request& request) {
+    const auto recording = openRecordings(request.recordings);
     if (!recording) {
         return recording.error();
     }
     auto journal = std::make_unique<BoundedJournal>(BoundedJournal::stateFolder());
+    std::uint64_t packets = 0;
     while (const auto packet = (*recording)->next()) {
         journal->add(packet->time, packet->data);
-        if (mayContinue && !mayContinue()) {
-            break;
+        if (request.progress && ++packets % kPacketsBetweenCalls == 0) {
+            request.progress(packets);
         }
     }
     OpenJournal opened{nullptr, (*recording)->technology()};
@@ -75,8 +78,7 @@ Result<std::unique_ptr<RecordedTimeline>, RecordingError>
 RecordedTimeline::open(const Request& request, const DecoderEnvironment& environment) {
     const bool isFile =
         request.recordings.size() == 1 && RecordingJournal::isSuitable(request.recordings.front());
-    auto opened = isFile ? openFile(request.recordings.front())
-                         : keep(request.recordings, request.mayContinue);
+    auto opened = isFile ? openFile(request.recordings.front()) : keep(request);
     if (!opened) {
         return opened.error();
     }
@@ -92,7 +94,12 @@ RecordedTimeline::open(const Request& request, const DecoderEnvironment& environ
     made->_timeline = std::make_unique<Timeline>(
         *made->_journal, DecodingSource{*technology, environment.resources, environment.bundle,
                                         environment.technologies});
-    (void)made->_timeline->index(request.mayContinue);
+    (void)made->_timeline->index([&] {
+        if (request.progress) {
+            request.progress(made->_timeline->packets());
+        }
+        return true;
+    });
     return made;
 }
 

@@ -6,6 +6,8 @@
 #include "text/Result.h"
 #include "timeline/Timeline.h"
 
+#include <cstdint>
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -19,7 +21,8 @@ public:
         std::vector<std::string>
             recordings; ///< not empty; several are one, in order of their times
         const RecordedTechnology* technology = nullptr; ///< overrides the link type
-        MayContinue mayContinue = {};
+        /// Called now and then with the number of packets that were read.
+        std::function<void(std::uint64_t packets)> progress = {};
     };
 
     /// Opens the recordings and reads them once. A file is read again where it is needed; of a

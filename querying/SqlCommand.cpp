@@ -2,12 +2,15 @@
 
 #include "LogGenerator/Technologies/Technologies.h"
 #include "console/Output.h"
+#include "console/Progress.h"
+#include "console/TerminalLine.h"
 #include "decoding/DroppedNotices.h"
 #include "decoding/RequiredTemplates.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
 #include "host/KnowledgeFiles.h"
 #include "host/UserFolders.h"
+#include "host/WallClock.h"
 #include "knowledge/Networks.h"
 #include "query/Functions.h"
 #include "query/TimelineTables.h"
@@ -74,13 +77,41 @@ QueryKnowledge knowledge() {
             }};
 }
 
-ExitStatus writeRows(Query& query, RowFormat format) {
-    Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
+/// Shows on a terminal what a user waits for.
+class Waiting {
+public:
+    void reading(std::uint64_t packets) { show("reading: ", packetCount(packets)); }
+    void querying() { show("querying", ""); }
+    /// Standard output; wipes the line first.
+    Output::Write output() {
+        return [this, write = writeToDescriptor(STDOUT_FILENO, "Standard output")](
+                   std::string_view block) {
+            _line.wipe();
+            write(block);
+        };
+    }
+    void end() { _line.wipe(); }
+
+private:
+    void show(std::string_view what, const std::string& amount) {
+        if (_line.isPossible() && _pace.isDue()) {
+            _line.show(std::string(what) + amount);
+        }
+    }
+
+    WallClock _clock;
+    TerminalLine _line = TerminalLine::onStandardError();
+    ProgressPace _pace{_clock};
+};
+
+ExitStatus writeRows(Query& query, RowFormat format, Waiting& waiting) {
+    Output output(waiting.output());
     RowWriter writer(format, query.columns(), output);
     while (true) {
         auto row = query.next();
         if (!row) {
             writer.finish();
+            waiting.end();
             complain(row.error().sentence);
             return kExitFailure;
         }
@@ -122,8 +153,12 @@ ExitStatus runSql(const SqlOptions& options) {
     const BuildBundle bundle;
     DroppedNotices notices;
     const DecoderEnvironment environment{resources, bundle, notices, technologies()};
+    Waiting waiting;
     const auto recorded =
-        RecordedTimeline::open({question->recordings, options.technology, {}}, environment);
+        RecordedTimeline::open({question->recordings, options.technology,
+                                [&waiting](std::uint64_t packets) { waiting.reading(packets); }},
+                               environment);
+    waiting.end();
     if (!recorded) {
         complain(recorded.error().sentence);
         return kExitFailure;
@@ -137,7 +172,12 @@ ExitStatus runSql(const SqlOptions& options) {
         return kExitWrongUsage;
     }
     auto running = std::move(query).value();
-    const ExitStatus status = writeRows(running, options.format);
+    database.setMayContinue([&waiting] {
+        waiting.querying();
+        return true;
+    });
+    const ExitStatus status = writeRows(running, options.format, waiting);
+    waiting.end();
     const std::vector<std::string> notes = (*recorded)->notes();
     for (const std::string& note : notes) {
         complain(note);

@@ -222,6 +222,12 @@ TEST_F(EndToEndStatus, OfSnapshot) {
                            "<array><dict><key>DLF</key><data>AQI=</data></dict></array></dict>"
                            "</plist>";
     ends({{"snapshot", "--dlf", path}, 0, ""});
+    const std::string full = world.path("full");
+    std::filesystem::create_symlink("/dev/full", full);
+    ends({{"snapshot", "--dlf", path, "-o", full},
+          1,
+          "pallax: " + full + " cannot be written: No space left on device.\n"});
+    EXPECT_TRUE(std::filesystem::is_symlink(full)) << "a device is not replaced by a file";
     ends({{"snapshot", "--dlf", sample}, 1, "pallax: " + sample + " is not a snapshot.\n"});
     ends({{"snapshot", path}, 2, "pallax: --dlf is required (see pallax snapshot --help)\n"});
     expectEveryDocumentedStatus({"snapshot"});

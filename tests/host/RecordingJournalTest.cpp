@@ -56,7 +56,8 @@ protected:
         return count;
     }
     static void expectAnyStart(RecordingJournal& journal) {
-        for (const std::uint64_t from : {1, 2, 4096, 4097, 4098, 8192, 8193, 9999, 10000, 10001}) {
+        for (const std::uint64_t from :
+             {1U, 2U, 4096U, 4097U, 4098U, 8192U, 8193U, 9999U, 10000U, 10001U}) {
             EXPECT_EQ(readAll(*journal.reader(from), from), kCount + 1 - from) << from;
         }
     }

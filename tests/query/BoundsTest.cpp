@@ -7,16 +7,16 @@ namespace {
 /// form that no table knows (+column).
 class BoundsTest : public testing::TestWithParam<const char*> {
 protected:
-    QueryFixture _fixture{GetParam(), 3, std::chrono::seconds(12)};
+    QueryFixture _fixture{GetParam(), 3, std::chrono::seconds(6)};
 
     void holdsFor(const std::string& table, const std::string& columns) {
         namespace any = doubles::any;
         EXPECT_TRUE(doubles::holds([&] {
             const std::int64_t start = microseconds(Simulation::kStart);
-            const std::int64_t from = start + any::longBetween(-2'000'000, 14'000'000);
+            const std::int64_t from = start + any::longBetween(-2'000'000, 8'000'000);
             const std::int64_t to = from + any::longBetween(-1'000'000, 8'000'000);
-            const std::string first = std::to_string(any::between(0, 550));
-            const std::string last = std::to_string(any::between(0, 550));
+            const std::string first = std::to_string(any::between(0, 270));
+            const std::string last = std::to_string(any::between(0, 270));
             const auto ask = [&](const std::string& sign) {
                 std::string text = "select " + columns + " from " + table + " where 1";
                 text += " and " + sign + "time >= " + std::to_string(from);
