@@ -8,6 +8,7 @@
 #include "decoding/RequiredTemplates.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
+#include "host/Snapshot.h"
 #include "host/WallClock.h"
 #include "text/Format.h"
 #include "timeline/Timeline.h"
@@ -134,6 +135,10 @@ ExitStatus EventsCommand::tell(const std::string& path, Output& output) {
         _options.technology != nullptr ? _options.technology : (*recording)->technology();
     if (technology == nullptr) {
         _report((*recording)->foreignLinkType().sentence);
+        return kExitFailure;
+    }
+    if ((*recording)->technology() == &kSnapshotTechnology) {
+        _report(noTimeOfSnapshot(path).sentence);
         return kExitFailure;
     }
     return tellEvents(**recording, *technology, output);

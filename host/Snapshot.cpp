@@ -2,6 +2,7 @@
 
 #include "host/Files.h"
 #include "plist/PropertyListCodec.h"
+#include "text/Format.h"
 #include "text/TimeText.h"
 
 #include <utility>
@@ -120,6 +121,11 @@ std::optional<Snapshot> readSnapshot(const std::string& path) {
 std::unique_ptr<Recording> recordingOfSnapshot(const std::string& path, const std::string& name) {
     auto snapshot = readSnapshot(path);
     return snapshot ? std::make_unique<SnapshotRecording>(name, std::move(*snapshot)) : nullptr;
+}
+
+RecordingError noTimeOfSnapshot(const std::string& path) {
+    return {RecordingError::Kind::NoCapture,
+            formatText("%@ is a snapshot, which holds a few displays and no packets.", {path})};
 }
 
 } // namespace pallax

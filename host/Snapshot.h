@@ -45,6 +45,9 @@ inline constexpr const char* kSnapshotDescription = "Description";
 inline constexpr const char* kSnapshotTitle = "Title";
 inline constexpr const char* kSnapshotDisplay = "Display";
 
+/// The error for a snapshot where a recording is needed.
+RecordingError noTimeOfSnapshot(const std::string& path);
+
 /// The snapshot in a file as a recording; null if the file is not a snapshot.
 std::unique_ptr<Recording> recordingOfSnapshot(const std::string& path, const std::string& name);
 

@@ -34,6 +34,10 @@ void step(sqlite3_context* context, int /*count*/, sqlite3_value** arguments) {
     if (*held == nullptr) {
         *held = std::make_unique<Weighted>().release();
     }
+    constexpr std::size_t kMostValues = std::size_t{8} << 20U; // 128 MiB
+    if ((*held)->values.size() >= kMostValues) {
+        return sqlite3_result_error(context, "quantile() takes at most 8,388,608 values", -1);
+    }
     const double weight = sqlite3_value_double(arguments[1]);
     if (isNumber(arguments[0]) && weight > 0) {
         (*held)->values.emplace_back(sqlite3_value_double(arguments[0]), weight);

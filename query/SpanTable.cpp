@@ -1,7 +1,9 @@
 #include "query/SpanTable.h"
 
+#include "packets/StampSequence.h"
 #include "query/SampleReader.h"
 
+#include <algorithm>
 #include <deque>
 #include <unordered_map>
 
@@ -96,6 +98,10 @@ private:
     void goTo(std::uint64_t packet, Time time) {
         if (packet != _packet) {
             endReplaced();
+            if (_stamps.stepTo(time)) {
+                endAll(); // what was between is unknown
+            }
+            _stamps.take(time);
             _packet = packet;
             _time = time;
         }
@@ -142,7 +148,7 @@ private:
     }
     void end(std::unordered_map<Key, Span>::iterator span, Time time) {
         if (span != _open.end()) {
-            span->second.end = time;
+            span->second.end = std::max(time, span->second.begin.time);
             _ended.push_back(std::move(span->second));
             _open.erase(span);
         }
@@ -156,6 +162,7 @@ private:
     ListId _list = 0;
     std::uint64_t _packet = 0;
     Time _time;
+    StampSequence _stamps;
     bool _isAtEnd = false;
 };
 

@@ -3,6 +3,7 @@
 #include "decoding/JoinedRecording.h"
 #include "host/BoundedJournal.h"
 #include "host/RecordingJournal.h"
+#include "host/Snapshot.h"
 #include "text/Format.h"
 
 #include <utility>
@@ -87,6 +88,9 @@ RecordedTimeline::open(const Request& request, const DecoderEnvironment& environ
         request.technology != nullptr ? request.technology : journal.technology;
     if (technology == nullptr) {
         return *journal.foreign;
+    }
+    if (journal.technology == &kSnapshotTechnology) {
+        return noTimeOfSnapshot(request.recordings.front());
     }
     std::unique_ptr<RecordedTimeline> made(new RecordedTimeline);
     made->_journal = std::move(journal.journal);

@@ -8,6 +8,7 @@
 #include "decoding/RequiredTemplates.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
+#include "host/Files.h"
 #include "host/KnowledgeFiles.h"
 #include "host/UserFolders.h"
 #include "host/WallClock.h"
@@ -19,14 +20,14 @@
 #include "text/Suggestion.h"
 
 #include <algorithm>
-#include <fstream>
-#include <iterator>
 #include <unistd.h>
 #include <utility>
 
 namespace pallax {
 
 namespace {
+
+constexpr std::size_t kLongestQuery = std::size_t{1} << 20U;
 
 struct Question {
     std::vector<std::string> recordings;
@@ -42,11 +43,13 @@ struct Refusal {
 Result<Question, Refusal> questionOf(const SqlOptions& options) {
     Question question{options.words, {}};
     if (options.file) {
-        std::ifstream file(*options.file, std::ios::binary);
-        question.query.assign(std::istreambuf_iterator<char>(file), {});
-        if (!file) {
-            return Refusal{formatText("%@ cannot be read.", {*options.file}), kExitFailure};
+        const auto content = readRegularFile(*options.file, kLongestQuery);
+        if (!content) {
+            return Refusal{
+                formatText("%@ cannot be read: %@.", {*options.file, content.error().reason}),
+                kExitFailure};
         }
+        question.query.assign(content->begin(), content->end());
     } else if (!question.recordings.empty()) {
         question.query = std::move(question.recordings.back());
         question.recordings.pop_back();

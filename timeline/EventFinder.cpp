@@ -43,14 +43,6 @@ std::string joined(const std::vector<std::string>& texts) {
     return all;
 }
 
-/// "after 31 s"; nothing where the clock stepped back.
-std::string dwell(Time since, Time now) {
-    return now < since
-               ? std::string()
-               : formatText(" after %lld s",
-                            {std::chrono::round<std::chrono::seconds>(now - since).count()});
-}
-
 /// The access point, if the object has one.
 std::string nameOf(const PropertyList& context) {
     const DictionaryRef keys = context.dictionary();
@@ -68,7 +60,7 @@ EventFinder::EventFinder(std::string_view technology, const FieldTable& fields, 
         if (rule.technology != technology) {
             continue;
         }
-        Row row{&rule, {}, false, {}, {}, {}, {}};
+        Row row{&rule, {}, false, {}, {}, {}, false, {}};
         for (const std::string_view name : rule.fields) {
             const auto field = fields.named(name);
             if (!field) {
@@ -140,21 +132,21 @@ void EventFinder::lookAtCell(Row& row, const Moment& moment) {
     }
     const bool isCompleted =
         isSame && std::find(row.value.begin(), row.value.end(), "") != row.value.end();
-    if (isCompleted || (isSame && moment.time - row.since <= kSettling)) {
+    if (isCompleted || (isSame && timeSince(row, moment) <= kSettling)) {
         row.value = std::move(cell);
         return;
     }
     if (row.isKnown && !isOvershadowed(row)) {
-        const bool isBack =
-            cell == row.before && moment.time >= row.since && moment.time - row.since <= _pingPong;
+        const bool isBack = cell == row.before && timeSince(row, moment) <= _pingPong;
         std::string words(row.rule->subject);
         words.append(" ").append(isSame ? joined(row.value) : row.value.front());
         words.append(kArrow).append(isSame ? joined(cell) : cell.front());
-        words.append(dwell(row.since, moment.time)).append(isBack ? " (ping-pong)" : "");
+        words.append(dwell(row, moment)).append(isBack ? " (ping-pong)" : "");
         add(row, isBack ? EventKind::PingPong : EventKind::CellChange, std::move(words), moment);
     }
     row.before = std::exchange(row.value, std::move(cell));
     row.since = moment.time;
+    row.isInterrupted = false;
     row.isKnown = true;
 }
 
@@ -190,11 +182,12 @@ void EventFinder::lookAtService(Row& row, const Moment& moment) {
         const std::string cause = value.empty() || row.rule->good.empty() ? "" : ": " + value;
         add(row, isGood ? EventKind::ServiceRegained : EventKind::ServiceLost,
             std::string(row.rule->subject) + (isGood ? " regained" : " lost") + cause +
-                dwell(row.since, moment.time),
+                dwell(row, moment),
             moment);
     }
     row.isGood = isGood;
     row.since = moment.time;
+    row.isInterrupted = false;
 }
 
 void EventFinder::lookAtContexts(Row& row, const Moment& moment) {
@@ -234,6 +227,25 @@ void EventFinder::add(const Row& row, EventKind kind, std::string words, const M
                              moment.packet,
                              std::move(words),
                              {row.rule->fields.begin(), row.rule->fields.end()}});
+}
+
+void EventFinder::noteStep() {
+    for (Row& row : _rows) {
+        row.isInterrupted = true;
+    }
+}
+
+std::chrono::nanoseconds EventFinder::timeSince(const Row& row, const Moment& moment) {
+    return row.isInterrupted || moment.time < row.since ? std::chrono::nanoseconds::max()
+                                                        : moment.time - row.since;
+}
+
+std::string EventFinder::dwell(const Row& row, const Moment& moment) {
+    const auto time = timeSince(row, moment);
+    return time == std::chrono::nanoseconds::max()
+               ? std::string()
+               : formatText(" after %lld s",
+                            {std::chrono::round<std::chrono::seconds>(time).count()});
 }
 
 Event EventFinder::eventOf(const StampRemark& step, std::uint64_t packet, Time time) {

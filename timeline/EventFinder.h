@@ -34,6 +34,8 @@ public:
     /// Appends the events of a packet to `events`. `values` are those after it.
     void endPacket(std::uint64_t packet, Time time, const CurrentValues& values,
                    std::vector<Event>& events);
+    /// The next packet's stamp steps: how long the current values have held is unknown.
+    void noteStep();
     /// The packet's stamp steps.
     static Event eventOf(const StampRemark& step, std::uint64_t packet, Time time);
 
@@ -46,6 +48,7 @@ private:
         std::vector<std::string> value; ///< of each field; of contexts, their names
         std::vector<std::string> before;
         Time since;
+        bool isInterrupted = false; ///< by a gap or a step of the clock since then
         std::optional<bool> isGood;
     };
     struct Moment {
@@ -65,6 +68,10 @@ private:
     void lookAtCell(Row& row, const Moment& moment);
     void lookAtState(Row& row, const Moment& moment);
     void lookAtService(Row& row, const Moment& moment);
+    /// The greatest time there is if it is unknown.
+    static std::chrono::nanoseconds timeSince(const Row& row, const Moment& moment);
+    /// " after 31 s"; empty if it is unknown.
+    static std::string dwell(const Row& row, const Moment& moment);
     void lookAtContexts(Row& row, const Moment& moment);
     bool isOvershadowed(const Row& row) const;
     static void add(const Row& row, EventKind kind, std::string words, const Moment& moment);

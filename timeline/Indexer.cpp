@@ -77,6 +77,7 @@ void Timeline::Indexer::noteStamp(const JournalPacket& packet) {
     const auto& step = _grid.step();
     if (step && step->kind != StampRemark::Kind::OutOfRange) {
         addEvent(EventFinder::eventOf(*step, packet.number, packet.time));
+        _finder.noteStep();
     }
     std::vector<Stretch>& stretches = _timeline._stretches;
     const bool isBack = step && step->kind == StampRemark::Kind::StepBack;

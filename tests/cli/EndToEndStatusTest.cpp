@@ -231,6 +231,10 @@ TEST_F(EndToEndStatus, OfSnapshot) {
     ends({{"snapshot", "--dlf", sample}, 1, "pallax: " + sample + " is not a snapshot.\n"});
     ends({{"snapshot", path}, 2, "pallax: --dlf is required (see pallax snapshot --help)\n"});
     expectEveryDocumentedStatus({"snapshot"});
+    const std::string sentence =
+        "pallax: " + path + " is a snapshot, which holds a few displays and no packets.\n";
+    ends({{"events", path}, 1, sentence});
+    ends({{"sql", path, "select 1"}, 1, sentence});
 }
 
 TEST_F(EndToEndStatus, OfSql) {
@@ -248,7 +252,9 @@ TEST_F(EndToEndStatus, OfSql) {
           2,
           "pallax: no such column: tme. Did you mean \"time\"? (line 1, column 8 of the query)\n"});
     ends({{"sql", sample, "drop table packet"}, 2, "pallax: A query can only read.\n"});
-    ends({{"sql", "--file", missing, sample}, 1, "pallax: " + missing + " cannot be read.\n"});
+    ends({{"sql", "--file", missing, sample},
+          1,
+          "pallax: " + missing + " cannot be read: No such file or directory.\n"});
     expectEveryDocumentedStatus({"sql"});
 }
 

@@ -72,6 +72,11 @@ TEST(TimesThatComeTwice, AreFoundInBothStretches) {
     Database database;
     addTimelineTables(database, *timeline);
     ASSERT_EQ(timeline->stretches().size(), 2U);
+    EXPECT_EQ(linesOf(database, "select count(*) from span where hold < 0"),
+              std::vector<std::string>{"0"});
+    EXPECT_EQ(linesOf(database, "select count(*) from span where hold > 10500000"),
+              std::vector<std::string>{"0"})
+        << "no value holds from one stretch to the next";
     const std::string from = std::to_string(microseconds(Simulation::kStart) + 4'000'000);
     const std::string select =
         "select count(*) from packet where time between " + from + " and " + from + " + 2000000";

@@ -165,6 +165,18 @@ TEST_F(EventsTest, GapsAndStepsOfTime) {
                                "151 s time-step: time steps back 10.0 s"}));
 }
 
+TEST_F(EventsTest, AfterAGapItIsUnknownHowLongAValueHeld) {
+    use("lte");
+    add(100, lteCell(150));
+    add(103, lteCell(151));
+    add(170, lteCell(150));
+    add(175, lteCell(152));
+    EXPECT_EQ(events(), (Lines{"103 s cell-change: serving cell 150 → 151 after 3 s",
+                               "170 s gap: no packets for 67.0 s",
+                               "170 s cell-change: serving cell 151 → 150",
+                               "175 s cell-change: serving cell 150 → 152 after 5 s"}));
+}
+
 TEST_F(EventsTest, TheOldestAreDroppedAndCounted) {
     use("lte");
     for (int change = 0; change < 100; ++change) {
