@@ -97,7 +97,7 @@ TEST_F(EventsCommandTest, OfSeveralRecordingsEachLineNamesItsOwnAndOneThatFailsS
     EXPECT_EQ(run(), kExitFailure);
     EXPECT_EQ(written,
               "a.pcap: 2023-11-14 22:15:00.000  gap               no packets for 100.0 s\n"
-              "a.pcap: 2023-11-14 22:15:00.000  cell-change       serving cell 1 → 2 after 100 s\n"
+              "a.pcap: 2023-11-14 22:15:00.000  cell-change       serving cell 1 → 2\n"
               "b.pcap: 2023-11-14 22:13:40.000  cell-change       serving cell 3 → 4 after 20 s\n");
     EXPECT_EQ(reports, (std::vector<std::string>{"missing.pcap is not there",
                                                  "b.pcap ends in the middle of a packet."}));
