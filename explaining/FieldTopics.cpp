@@ -13,7 +13,8 @@ namespace {
 
 /// A name, or what follows a dot in it.
 bool isCalled(const std::string& name, std::string_view word) {
-    return name == word || (!word.empty() && name.ends_with("." + std::string(word)));
+    const bool isEnd = !word.empty() && name.size() > word.size() && name.ends_with(word);
+    return name == word || (isEnd && name[name.size() - word.size() - 1] == '.');
 }
 
 std::string joined(const std::vector<std::string>& words, std::string_view separator) {
