@@ -13,7 +13,7 @@ constexpr Hertz kStep30 = 30 * kKilohertz;
 constexpr Hertz kStep50 = 50 * kKilohertz;
 
 /// Both directions have the same numbers; frequencies of the first channel, in MHz.
-constexpr ChannelRow cdmaRow(std::string_view bandClass, std::uint32_t first, std::uint32_t last,
+consteval ChannelRow cdmaRow(std::string_view bandClass, std::uint32_t first, std::uint32_t last,
                              Hertz spacing, double downlink, double uplink) {
     return {bandClass,
             {first, last, fromMegahertz(downlink)},
@@ -21,7 +21,7 @@ constexpr ChannelRow cdmaRow(std::string_view bandClass, std::uint32_t first, st
             spacing};
 }
 
-constexpr ChannelRow downlinkOnly(std::string_view bandClass, std::uint32_t first,
+consteval ChannelRow downlinkOnly(std::string_view bandClass, std::uint32_t first,
                                   std::uint32_t last, Hertz spacing, double downlink) {
     return {bandClass, {first, last, fromMegahertz(downlink)}, {}, spacing};
 }

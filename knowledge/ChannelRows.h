@@ -29,7 +29,7 @@ struct ChannelRow {
 constexpr Hertz kKilohertz = 1000;
 
 /// A frequency that the standards write in MHz with at most four decimals.
-constexpr Hertz fromMegahertz(double megahertz) {
+consteval Hertz fromMegahertz(double megahertz) {
     constexpr double kUnitsPerMegahertz = 10'000;
     constexpr double kHalf = 0.5;
     constexpr Hertz kHertzPerUnit = 100;

@@ -7,7 +7,7 @@ namespace pallax {
 namespace {
 
 /// Both directions have the same numbers.
-constexpr ChannelRow gsmRow(std::string_view band, std::uint32_t first, std::uint32_t last,
+consteval ChannelRow gsmRow(std::string_view band, std::uint32_t first, std::uint32_t last,
                             double downlink, double uplink) {
     return {band,
             {first, last, fromMegahertz(downlink)},

@@ -15,19 +15,19 @@ struct Range {
     double megahertz;
 };
 
-constexpr ChannelRow::Side sideOf(Range range) {
+consteval ChannelRow::Side sideOf(Range range) {
     return {range.first, range.last, fromMegahertz(range.megahertz)};
 }
 
-constexpr ChannelRow fdd(std::string_view band, Range downlink, Range uplink) {
+consteval ChannelRow fdd(std::string_view band, Range downlink, Range uplink) {
     return {band, sideOf(downlink), sideOf(uplink), kRaster};
 }
 
-constexpr ChannelRow downlinkOnly(std::string_view band, Range downlink) {
+consteval ChannelRow downlinkOnly(std::string_view band, Range downlink) {
     return {band, sideOf(downlink), {}, kRaster};
 }
 
-constexpr ChannelRow tdd(std::string_view band, Range both) {
+consteval ChannelRow tdd(std::string_view band, Range both) {
     return {band, sideOf(both), sideOf(both), kRaster};
 }
 

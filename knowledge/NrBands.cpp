@@ -39,23 +39,23 @@ struct NrBand {
     Range uplink;
 };
 
-constexpr Range rangeOf(double first, double last) {
+consteval Range rangeOf(double first, double last) {
     return {fromMegahertz(first), fromMegahertz(last)};
 }
 
-constexpr NrBand fdd(std::string_view name, Range downlink, Range uplink) {
+consteval NrBand fdd(std::string_view name, Range downlink, Range uplink) {
     return {name, downlink, uplink};
 }
 
-constexpr NrBand tdd(std::string_view name, double first, double last) {
+consteval NrBand tdd(std::string_view name, double first, double last) {
     return {name, rangeOf(first, last), rangeOf(first, last)};
 }
 
-constexpr NrBand downlinkOnly(std::string_view name, double first, double last) {
+consteval NrBand downlinkOnly(std::string_view name, double first, double last) {
     return {name, rangeOf(first, last), {}};
 }
 
-constexpr NrBand uplinkOnly(std::string_view name, double first, double last) {
+consteval NrBand uplinkOnly(std::string_view name, double first, double last) {
     return {name, {}, rangeOf(first, last)};
 }
 

@@ -9,7 +9,7 @@ namespace {
 constexpr Hertz kRaster = 200 * kKilohertz;
 
 /// A UARFCN is five times the distance from an offset, in MHz.
-constexpr ChannelRow::Side sideOf(std::uint32_t first, std::uint32_t last, double offset) {
+consteval ChannelRow::Side sideOf(std::uint32_t first, std::uint32_t last, double offset) {
     // Offsets below 0 are shifted, because fromMegahertz rounds upwards.
     constexpr double kShift = 1000;
     return {first, last, first * kRaster + fromMegahertz(offset + kShift) - fromMegahertz(kShift)};
@@ -22,13 +22,13 @@ struct Range {
     double offset;
 };
 
-constexpr ChannelRow general(std::string_view band, Range downlink, Range uplink) {
+consteval ChannelRow general(std::string_view band, Range downlink, Range uplink) {
     return {band, sideOf(downlink.first, downlink.last, downlink.offset),
             sideOf(uplink.first, uplink.last, uplink.offset), kRaster};
 }
 
 /// The uplink's numbers of additional channels are those of the downlink less a distance.
-constexpr ChannelRow additional(std::string_view band, Range downlink, std::uint32_t distance,
+consteval ChannelRow additional(std::string_view band, Range downlink, std::uint32_t distance,
                                 double uplinkOffset) {
     constexpr std::uint32_t kStep = 25;
     return {band, sideOf(downlink.first, downlink.last, downlink.offset),
@@ -82,7 +82,7 @@ constexpr auto kFddRows = std::to_array<ChannelRow>({
 });
 
 /// Five times the frequency in MHz, for both directions.
-constexpr ChannelRow tdd(std::string_view band, std::uint32_t first, std::uint32_t last) {
+consteval ChannelRow tdd(std::string_view band, std::uint32_t first, std::uint32_t last) {
     return {band, sideOf(first, last, 0), sideOf(first, last, 0), kRaster};
 }
 

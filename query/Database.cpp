@@ -85,6 +85,7 @@ void giveTo(sqlite3_context& context, const QueryValue& value) {
 void call(sqlite3_context* context, int count, sqlite3_value** arguments) {
     const auto& function = *static_cast<Database::Function*>(sqlite3_user_data(context));
     std::vector<QueryValue> values;
+    values.reserve(static_cast<std::size_t>(count));
     for (int index = 0; index < count; ++index) {
         values.push_back(valueOf(arguments[index]));
     }

@@ -23,7 +23,7 @@ bool isNumber(sqlite3_value* value) {
 /// SQLite keeps only bytes for a group, all zero at first: a pointer.
 Weighted** weightedOf(sqlite3_context* context, bool isNew) {
     return static_cast<Weighted**>(
-        sqlite3_aggregate_context(context, isNew ? static_cast<int>(sizeof(Weighted*)) : 0));
+        sqlite3_aggregate_context(context, isNew ? static_cast<int>(sizeof(void*)) : 0));
 }
 
 void step(sqlite3_context* context, int /*count*/, sqlite3_value** arguments) {

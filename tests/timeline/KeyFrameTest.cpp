@@ -139,5 +139,35 @@ TEST(KeyFrame, HasTheBsicsThatOtherRecordsLookUp) {
     EXPECT_NE(pictureOf(resumed).find("BSIC = 18;"), std::string::npos) << pictureOf(resumed);
 }
 
+TEST(KeyFrames, AreAtTwiceTheDistanceWhenThereAreTooMany) {
+    TimelineFixture fixture("lte");
+    const auto timeline = fixture.indexed();
+    KeyFrames::Limits limits;
+    limits.distance = 10;
+    limits.count = 4;
+    KeyFrames keyFrames(limits);
+    const auto packets = [&] {
+        std::vector<std::uint64_t> numbers;
+        for (const TimelineKeyFrame& each : keyFrames.all()) {
+            numbers.push_back(each.packet);
+        }
+        return numbers;
+    };
+    using Numbers = std::vector<std::uint64_t>;
+    for (std::uint64_t packet = 0; packet <= 40; packet += 10) {
+        keyFrames.add({packet, {}, timeline->valuesAt(0), {}, {}});
+    }
+    EXPECT_EQ(packets(), (Numbers{0, 20, 40}));
+    EXPECT_FALSE(keyFrames.isDue(19, 0));
+    EXPECT_TRUE(keyFrames.isDue(20, 0));
+    EXPECT_EQ(keyFrames.atOrBefore(39)->packet, 20U);
+    EXPECT_EQ(keyFrames.atOrBefore(40)->packet, 40U);
+    keyFrames.dropBefore(21);
+    EXPECT_EQ(packets(), (Numbers{20, 40})) << "decoding goes on from 20 with packet 21";
+    keyFrames.dropBefore(22);
+    EXPECT_EQ(packets(), Numbers{40});
+    EXPECT_EQ(keyFrames.atOrBefore(39), nullptr);
+}
+
 } // namespace
 } // namespace pallax
