@@ -10,6 +10,7 @@
 
 #include "LogGenerator/LogPacket.h"
 #include "LogGenerator/Technologies/Technologies.h"
+#include "bench/ProcessorTime.h"
 #include "decoding/DecodeCommand.h"
 #include "decoding/DroppedNotices.h"
 #include "decoding/RecordingDecoder.h"
@@ -25,7 +26,6 @@
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
-#include <ctime>
 #include <limits>
 #include <string>
 
@@ -169,14 +169,6 @@ struct Way {
     std::uint64_t written = 0;
     std::uint64_t checksum = 0;
 };
-
-/// Of this process; less affected by other programs than wall-clock time.
-double processorSeconds() {
-    timespec time{};
-    (void)::clock_gettime(CLOCK_PROCESS_CPUTIME_ID, &time);
-    constexpr double kPerNanosecond = 1e-9;
-    return static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_nsec) * kPerNanosecond;
-}
 
 void go(Way& way, const std::string& path) {
     const double start = processorSeconds();

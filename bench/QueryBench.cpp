@@ -6,6 +6,7 @@
 // ("events", and "joined", how many there were).
 
 #include "LogGenerator/Technologies/Technologies.h"
+#include "bench/ProcessorTime.h"
 #include "host/BuildBundle.h"
 #include "host/DirectoryResources.h"
 #include "host/RecordingJournal.h"
@@ -16,7 +17,6 @@
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
-#include <ctime>
 #include <sqlite3.h>
 #include <string>
 #include <variant>
@@ -34,14 +34,6 @@ constexpr const char* kEvents =
 [[noreturn]] void fail(const std::string& sentence) {
     (void)std::fprintf(stderr, "query_bench: %s\n", sentence.c_str());
     std::exit(1); // NOLINT(concurrency-mt-unsafe)
-}
-
-/// Of this process; less affected by other programs than wall-clock time.
-double processorSeconds() {
-    timespec time{};
-    (void)::clock_gettime(CLOCK_PROCESS_CPUTIME_ID, &time);
-    constexpr double kPerNanosecond = 1e-9;
-    return static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_nsec) * kPerNanosecond;
 }
 
 /// Runs the query and returns the number of its rows.

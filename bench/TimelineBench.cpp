@@ -7,6 +7,7 @@
 // seconds of `decode --every end`.
 
 #include "LogGenerator/Technologies/Technologies.h"
+#include "bench/ProcessorTime.h"
 #include "console/Output.h"
 #include "decoding/DroppedNotices.h"
 #include "decoding/RecordingDecoder.h"
@@ -20,7 +21,6 @@
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
-#include <ctime>
 #include <fstream>
 #include <random>
 #include <string>
@@ -33,14 +33,6 @@ using namespace pallax;
 [[noreturn]] void fail(const std::string& sentence) {
     (void)std::fprintf(stderr, "timeline_bench: %s\n", sentence.c_str());
     std::exit(1); // NOLINT(concurrency-mt-unsafe)
-}
-
-/// Of this process; less affected by other programs than wall-clock time.
-double processorSeconds() {
-    timespec time{};
-    (void)::clock_gettime(CLOCK_PROCESS_CPUTIME_ID, &time);
-    constexpr double kPerNanosecond = 1e-9;
-    return static_cast<double>(time.tv_sec) + static_cast<double>(time.tv_nsec) * kPerNanosecond;
 }
 
 template <class Work>

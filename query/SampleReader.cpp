@@ -22,7 +22,7 @@ SampleReader::SampleReader(Timeline& timeline, const PacketRange& range,
 bool SampleReader::readMore() {
     _items.clear();
     _gone.clear();
-    while (_replay && _items.size() < kItemsAtOnce) {
+    while (_replay && _items.size() + _gone.size() < kItemsAtOnce) {
         const auto packet = _reader->next();
         if (!packet || packet->number > _last) {
             _replay.reset();

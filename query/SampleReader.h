@@ -34,7 +34,7 @@ public:
     SampleReader(Timeline& timeline, const PacketRange& range,
                  std::optional<FieldIndex> field = std::nullopt);
 
-    /// Replaces the items by those of the next packets that have any; false at the end.
+    /// Replaces the items by those of the next packets, which may have none; false at the end.
     bool readMore();
     const std::vector<Item>& items() const { return _items; }
     const std::vector<Gone>& gone() const { return _gone; }

@@ -22,10 +22,11 @@ std::vector<SeriesPoint> readSeries(Timeline& timeline, FieldIndex field, EntryI
                                     const MayContinue& mayContinue = {});
 
 /// The same readings in at most `count` ranges of packets that divide the time evenly or, where the
-/// clock steps back between the packets, their number. Of few packets the borders are exact. Those
-/// of many are moved to the next cell of the timeline's reduction, which need not be decoded again:
-/// then the first and the last bucket may contain up to a cell of packets before `from` and after
-/// `to`. What a bucket says is exact for the packets that it names. Texts: `Timeline::series`.
+/// clock steps back between the packets, their number. Few packets are decoded again, with exact
+/// borders. For many, the timeline's reduction answers without decoding, and borders move to the
+/// next of its cells: the first and the last bucket may then contain up to a cell of packets before
+/// `from` and after `to`. What a bucket says is exact for the packets that it names. Texts:
+/// `Timeline::series`.
 std::vector<Bucket> readBuckets(Timeline& timeline, FieldIndex field, EntryId entry,
                                 std::uint64_t from, std::uint64_t to, std::size_t count);
 

@@ -90,7 +90,7 @@ void SeriesStore::add(FieldIndex field, EntryId entry, const FieldValue& value) 
     if (text != nullptr && !series->runs.empty()) {
         const SeriesValue latest = series->runs.back().last;
         if (latest.text() != 0 && _texts.text(latest.text()) == text->view()) {
-            return add(*series, latest); // most texts come again, and need not be looked up
+            return add(*series, latest); // most texts repeat: no lookup
         }
     }
     add(*series, valueOf(value));
