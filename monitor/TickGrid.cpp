@@ -3,6 +3,18 @@
 namespace pallax {
 
 std::optional<TickGrid::Tick> TickGrid::passedBefore(Time packet) {
+    if (packet >= _stamps.latest() && packet < _nextTick) {
+        // Most packets pass no tick, and nothing has to be divided for them.
+        _step.reset();
+        _stamps.take(packet);
+        return std::nullopt;
+    }
+    const std::optional<Tick> passed = passedTick(packet);
+    _nextTick = next().time;
+    return passed;
+}
+
+std::optional<TickGrid::Tick> TickGrid::passedTick(Time packet) {
     _step = _stamps.stepTo(packet);
     if (_stamps.wouldStepBack(packet)) {
         const Tick last = next();

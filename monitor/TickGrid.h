@@ -36,10 +36,12 @@ public:
     const std::optional<StampRemark>& step() const { return _step; }
 
 private:
+    std::optional<Tick> passedTick(Time packet);
     TimeGrid grid() const { return {_stamps.first(), kInterval}; }
 
     StampSequence _stamps;
     std::optional<StampRemark> _step;
+    Time _nextTick = Time::min();
     std::uint64_t _passed = 0;       // in the current stretch
     std::uint64_t _passedBefore = 0; // in earlier stretches
 };

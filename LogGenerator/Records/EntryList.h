@@ -41,8 +41,12 @@ public:
     /// 1, so that the cost depends on the record's size, not on the number it claims.
     std::size_t wholeCount() const {
         const std::size_t first = _layout.start + _layout.bytesRead;
-        if (!_record.has(first)) {
+        if (_count == 0 || !_record.has(first)) {
             return 0;
+        }
+        // Most records are whole. Dividing takes as long as reading several fields.
+        if (_count <= kFewEntries && _record.has(first + (_count - 1) * _layout.stride)) {
+            return _count;
         }
         return std::min(_count, (_record.length() - first) / _layout.stride + 1);
     }
@@ -61,6 +65,8 @@ public:
     }
 
 private:
+    static constexpr std::size_t kFewEntries = 255;
+
     LogRecord _record;
     Layout _layout;
     std::size_t _count;

@@ -26,15 +26,9 @@ bool isRunning(std::span<const Field> fields) {
 } // namespace
 
 std::optional<ListLayout::Sizes> ListLayout::unexpectedSizes(const LogRecord& record) const {
-    if (!sizeCheck) {
-        return std::nullopt;
-    }
-    const std::size_t claimed = countIn(record);
-    const auto others = static_cast<std::size_t>(record.read(sizeCheck->otherCount));
-    const Sizes sizes{static_cast<std::uint8_t>(claimed * entries.layout.stride),
-                      static_cast<std::uint8_t>(record.length() - others * sizeCheck->otherLength)};
-    const bool areExpected = claimed != 0 && sizes.expected <= sizes.actual;
-    return areExpected ? std::nullopt : std::optional(sizes);
+    const std::size_t counted = countIn(record);
+    return sizeCheck && !seemsToFit(record, counted) ? std::optional(sizesIn(record, counted))
+                                                     : std::nullopt;
 }
 
 bool ListPart::looksFor(const PropertyList& element) const {

@@ -204,9 +204,9 @@ struct ListLayout {
     std::size_t countIn(const LogRecord& place) const {
         return (count ? static_cast<std::size_t>(place.read(*count)) : 0) + plus;
     }
-    EntryList entriesIn(const LogRecord& place) const {
-        return {place, varying != nullptr ? varying(place) : entries.layoutIn(place),
-                countIn(place)};
+    EntryList entriesIn(const LogRecord& place) const { return entriesIn(place, countIn(place)); }
+    EntryList entriesIn(const LogRecord& place, std::size_t counted) const {
+        return {place, varying != nullptr ? varying(place) : entries.layoutIn(place), counted};
     }
     /// The size of the entries in bytes, as the record claims it and as it has room for, each cut
     /// to 8 bits.
@@ -214,8 +214,18 @@ struct ListLayout {
         std::uint8_t expected;
         std::uint8_t actual;
     };
-    /// Both sizes, if the list has a size check and the record claims no entries, or more than it
-    /// seems to have room for.
+    /// For a list with a size check and that number of entries.
+    Sizes sizesIn(const LogRecord& record, std::size_t counted) const {
+        const auto others = static_cast<std::size_t>(record.read(sizeCheck->otherCount));
+        return {static_cast<std::uint8_t>(counted * entries.layout.stride),
+                static_cast<std::uint8_t>(record.length() - others * sizeCheck->otherLength)};
+    }
+    /// False if the record claims no entries, or more than it seems to have room for.
+    bool seemsToFit(const LogRecord& record, std::size_t counted) const {
+        const Sizes sizes = sizesIn(record, counted);
+        return counted != 0 && sizes.expected <= sizes.actual;
+    }
+    /// Both sizes, if the list has a size check and does not seem to fit.
     std::optional<Sizes> unexpectedSizes(const LogRecord& record) const;
 };
 

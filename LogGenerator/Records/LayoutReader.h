@@ -131,20 +131,33 @@ private:
         const std::size_t count = list.countIn(place);
         const bool isKept = list.staysWithoutEntries && count == 0;
         if (!isKept && (list.isShown || Sink::kTakesHidden)) {
-            readEntries(list, place, first);
+            readEntries(list, place, count, first);
         }
-        _next = first + static_cast<FieldId>(list.fields.size() + rowCount(list.lists));
+        _next = first + static_cast<FieldId>(list.fields.size());
+        if (!list.lists.empty()) {
+            _next += static_cast<FieldId>(rowCount(list.lists));
+        }
     }
 
-    void readEntries(const ListLayout& list, const LogRecord& place, FieldId first) {
-        const EntryList entries = list.entriesIn(place);
-        const std::size_t whole = list.unexpectedSizes(place) ? 0 : entries.wholeCount();
+    void readEntries(const ListLayout& list, const LogRecord& place, std::size_t count,
+                     FieldId first) {
+        const EntryList entries = list.entriesIn(place, count);
+        const bool isRefused = list.sizeCheck && !list.seemsToFit(place, count);
+        const std::size_t whole = isRefused ? 0 : entries.wholeCount();
+        _sink.beginList({list.key, &list, whole});
+        if (whole > 0) {
+            readEach(list, place, entries, whole, first);
+        }
+        _sink.endList();
+    }
+
+    void readEach(const ListLayout& list, const LogRecord& place, const EntryList& entries,
+                  std::size_t whole, FieldId first) {
         // Not an optional: the compiler warns that its content may be uninitialized.
         const EntryList companions =
             list.companion ? EntryList(place, list.companion->layoutIn(place), entries.count())
                            : EntryList({}, {}, 0);
         const bool mayBeLonger = hasLongerEntries(list);
-        _sink.beginList({list.key, &list, whole});
         for (std::size_t index = 0; index < whole; ++index) {
             const LogRecord entry = entries.at(index);
             if (list.only != nullptr && !list.only->holdsIn(entry)) {
@@ -168,7 +181,6 @@ private:
             }
             _sink.endEntry();
         }
-        _sink.endList();
     }
 
     /// Whether a field that depends on a condition may lie after the bytes that make an entry

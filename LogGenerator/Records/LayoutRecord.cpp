@@ -105,9 +105,8 @@ void LayoutRecord::updateWithData(const LogRecord& record, LogCode logCode) {
     if (_sink != nullptr) {
         LayoutReader(*_sink, _memory, _firstRow + code->firstRow).read(layout, record);
     }
-    _display.keep({&layout, _firstRow + code->firstRow,
-                   code->hasShapes ? shapeOf(layout, record) : 0, packetTime()},
-                  record);
+    _display.keep(layout, _firstRow + code->firstRow, code->hasShapes ? shapeOf(layout, record) : 0,
+                  packetTime(), record);
 }
 
 bool LayoutRecord::accepts(const CodeLayout& layout, const LogRecord& record) {

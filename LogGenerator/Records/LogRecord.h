@@ -110,8 +110,16 @@ private:
         if (std::endian::native != std::endian::little || position.bigEndian) {
             return gatherEach(position);
         }
-        return has(position.byte + sizeof(std::uint64_t)) ? load<std::uint64_t>(position.byte)
-                                                          : gatherLast(position.byte);
+        constexpr std::size_t kLoaded = sizeof(std::uint64_t);
+        if (has(position.byte + kLoaded)) {
+            return load<std::uint64_t>(position.byte);
+        }
+        if (has(kLoaded) && has(position.byte)) {
+            const std::size_t last = length() - kLoaded;
+            const std::size_t before = position.byte - last;
+            return before < kLoaded ? load<std::uint64_t>(last) >> (before * kByteBits) : 0;
+        }
+        return gatherLast(position.byte);
     }
     /// For little-endian machines. The bytes must be available.
     template <class Number>

@@ -17,21 +17,25 @@ bool SectionDisplay::shows(const PropertyList& value) const {
                             : _list != nullptr && value.array() == _list;
 }
 
-void SectionDisplay::keep(const Reading& reading, const LogRecord& record) {
-    if (_reading.code != reading.code || _reading.shape != reading.shape) {
+void SectionDisplay::keep(const CodeLayout& code, FieldId firstRow, unsigned shape, Time packet,
+                          const LogRecord& record) {
+    if (_code != &code || _shape != shape) {
         bringUpToDate();
     }
     _kept.assign(record.bytes().begin(), record.bytes().end());
-    _reading = reading;
+    _code = &code;
+    _firstRow = firstRow;
+    _shape = shape;
+    _packet = packet;
     if (!_isLate) {
         bringUpToDate();
     }
 }
 
 void SectionDisplay::bringUpToDate() {
-    if (const CodeLayout* code = std::exchange(_reading.code, nullptr)) {
-        _times.setPacket(_reading.packet);
-        LayoutReader(*this, _memory, _reading.firstRow).read(*code, LogRecord(_kept));
+    if (const CodeLayout* code = std::exchange(_code, nullptr)) {
+        _times.setPacket(_packet);
+        LayoutReader(*this, _memory, _firstRow).read(*code, LogRecord(_kept));
     }
 }
 

@@ -27,16 +27,10 @@ public:
 
     /// Whether records may wait until the display is brought up to date; false at first.
     void setLate(bool isLate) { _isLate = isLate; }
-    /// How a record is read. If the code is null, there is no record.
-    struct Reading {
-        const CodeLayout* code = nullptr;
-        FieldId firstRow = 0;
-        unsigned shape = 0; ///< `shapeOf`, or 0 if the code has no shapes
-        Time packet = {};
-    };
     /// Keeps an accepted record that may be read late. The kept one before is dropped if its code
-    /// and shape are the same, else read.
-    void keep(const Reading& reading, const LogRecord& record);
+    /// and shape (`shapeOf`, or 0 if the code has no shapes) are the same, else read.
+    void keep(const CodeLayout& code, FieldId firstRow, unsigned shape, Time packet,
+              const LogRecord& record);
     /// Reads the kept record, if any.
     void bringUpToDate();
 
@@ -76,8 +70,11 @@ private:
     ReadTimes _times;
 
     bool _isLate = false;
-    Reading _reading; ///< of the kept record
     ByteBuffer _kept;
+    const CodeLayout* _code = nullptr; ///< of the kept record; null without one
+    FieldId _firstRow = 0;
+    unsigned _shape = 0;
+    Time _packet = {};
 };
 
 } // namespace pallax

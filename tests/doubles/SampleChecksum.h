@@ -33,17 +33,19 @@ public:
     static std::uint64_t of(double number) { return std::bit_cast<std::uint64_t>(number); }
     static std::uint64_t of(std::string_view text) {
         constexpr unsigned kByteBits = 8;
-        std::uint64_t sum = text.size();
         std::uint64_t word = 0;
-        for (; text.size() >= sizeof(word); text.remove_prefix(sizeof(word))) {
-            std::memcpy(&word, text.data(), sizeof(word));
-            sum = mixed(sum, word);
+        if (text.size() < sizeof(word)) {
+            for (const char character : text) {
+                word = word << kByteBits | static_cast<unsigned char>(character);
+            }
+            return mixed(text.size(), word);
         }
-        word = 0;
-        for (const char character : text) {
-            word = word << kByteBits | static_cast<unsigned char>(character);
+        std::uint64_t sum = text.size();
+        const std::size_t last = text.size() - sizeof(word); // may overlap the word before it
+        for (std::size_t at = 0; at < last; at += sizeof(word)) {
+            sum = mixed(sum, wordAt(text, at));
         }
-        return mixed(sum, word);
+        return mixed(sum, wordAt(text, last));
     }
     static std::uint64_t of(std::string_view text, double number) {
         return mixed(of(text), of(number));
@@ -58,6 +60,11 @@ private:
     static constexpr std::array<std::uint64_t, 3> kFactors = {
         0x9E37'79B9'7F4A'7C15, 0xC2B2'AE3D'27D4'EB4F, 0x1656'67B1'9E37'79F9};
 
+    static std::uint64_t wordAt(std::string_view text, std::size_t at) {
+        std::uint64_t word = 0;
+        std::memcpy(&word, text.data() + at, sizeof(word));
+        return word;
+    }
     static std::uint64_t mixed(std::uint64_t sum, std::uint64_t number) {
         constexpr int kTurn = 29;
         return std::rotl((sum ^ number) * kFactors[0], kTurn);

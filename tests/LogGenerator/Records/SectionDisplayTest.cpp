@@ -66,7 +66,7 @@ constexpr CodeLayout kRemoves{.logCode = 6, .removes = kRemovedKeys, .emptiesLis
 class SectionDisplayTest : public testing::Test {
 protected:
     void show(const CodeLayout& code, const ByteBuffer& bytes, unsigned shape = 0) {
-        display.keep({.code = &code, .shape = shape}, LogRecord(bytes));
+        display.keep(code, 0, shape, {}, LogRecord(bytes));
     }
     void give(PropertyList object) {
         section = std::move(object);
