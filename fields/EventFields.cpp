@@ -1,5 +1,7 @@
 #include "fields/EventFields.h"
 
+#include "fields/ServingCells.h"
+
 #include <array>
 #include <cstddef>
 
@@ -10,22 +12,7 @@ namespace {
 using Watch = EventFields::Watch;
 using Names = std::string_view;
 
-// The cells.
-constexpr std::array<Names, 2> kIfxCell{"ifx.serving_cell.arfcn", "ifx.serving_cell.bsic"};
-constexpr std::array<Names, 2> kGsmCell{"gsm.gsm_serving_cell.arfcn", "gsm.gsm_serving_cell.bsic"};
-constexpr std::array<Names, 2> kUmtsCell{"gsm.umts_rr_info.scrambling_code",
-                                         "gsm.umts_rr_info.uarfcn"};
-constexpr std::array<Names, 3> kOneXCell{"cdma.system_identity.base_station_id",
-                                         "cdma.system_identity.network_id",
-                                         "cdma.system_identity.system_id"};
-constexpr std::array<Names, 2> kEvdoCell{"cdma.ev_do.serving_pn_offset", "cdma.ev_do.channel"};
 constexpr std::array<Names, 1> kNoPilot{"Invalid Value"};
-constexpr std::array<Names, 2> kLteCell{"lte.serving_cell_info.physical_cell_id",
-                                        "lte.serving_cell_info.download_frequency"};
-constexpr std::array<Names, 2> kLteMeasuredCell{"lte.serving_cell_measurements.physical_cell_id",
-                                                "lte.serving_cell_measurements.e_arfcn"};
-constexpr std::array<Names, 2> kUtranCell{"utran.serving_cell_info.cell_scrambling_code",
-                                          "utran.serving_cell_info.downlink_uarfcn"};
 
 // The state machines.
 constexpr std::array<Names, 1> kIfxRr{"ifx.rr"};
@@ -72,14 +59,14 @@ constexpr std::array<Names, 1> kUtranContexts{"utran.pdp_context_info"};
 constexpr std::string_view kCell = "serving cell";
 
 constexpr auto kRows = std::to_array<EventFields>({
-    {"ifx", Watch::Cell, kCell, kIfxCell},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfx},
     {"ifx", Watch::State, "RR", kIfxRr},
     {"ifx", Watch::Service, "service", kIfxNetwork},
 
     {"gsm", Watch::Technology, "GSM → UMTS", kRr, kToUmts},
     {"gsm", Watch::Technology, "UMTS → GSM", kRr, kToGsm},
-    {"gsm", Watch::Cell, "GSM serving cell", kGsmCell},
-    {"gsm", Watch::Cell, "UMTS serving cell", kUmtsCell},
+    {"gsm", Watch::Cell, "GSM serving cell", serving_cells::kGsm},
+    {"gsm", Watch::Cell, "UMTS serving cell", serving_cells::kUmts},
     {"gsm", Watch::State, "MM", kMm},
     {"gsm", Watch::State, "GMM", kGmm},
     {"gsm", Watch::State, "RR", kRr},
@@ -89,19 +76,19 @@ constexpr auto kRows = std::to_array<EventFields>({
     {"gsm", Watch::Service, "GPRS registration", kGmm, kGmmRegistered, kGmmLost},
     {"gsm", Watch::Contexts, "context", kGsmContexts},
 
-    {"cdma", Watch::Cell, "1x serving cell", kOneXCell},
-    {"cdma", Watch::Cell, "EV-DO serving cell", kEvdoCell, {}, kNoPilot},
+    {"cdma", Watch::Cell, "1x serving cell", serving_cells::kOneX},
+    {"cdma", Watch::Cell, "EV-DO serving cell", serving_cells::kEvdo, {}, kNoPilot},
     {"cdma", Watch::State, "1x", kOneXState, kOneXIdle},
     {"cdma", Watch::State, "EV-DO", kEvdoState},
     {"cdma", Watch::State, "EV-DO session", kEvdoSession},
     {"cdma", Watch::Service, "1x service", kOneXState, kOneXService, kOneXLost},
     {"cdma", Watch::Service, "EV-DO service", kEvdoState, kEvdoService, kEvdoLost},
 
-    {"lte", Watch::Cell, kCell, kLteCell},
-    {"lte", Watch::Cell, kCell, kLteMeasuredCell},
+    {"lte", Watch::Cell, kCell, serving_cells::kLte},
+    {"lte", Watch::Cell, kCell, serving_cells::kLteMeasured},
     {"lte", Watch::Contexts, "context", kLteContexts},
 
-    {"utran", Watch::Cell, kCell, kUtranCell},
+    {"utran", Watch::Cell, kCell, serving_cells::kUtran},
     {"utran", Watch::State, "RRC", kUtranRrc},
     {"utran", Watch::Contexts, "context", kUtranContexts},
 });

@@ -1,5 +1,6 @@
 #include "query/TimelineTables.h"
 
+#include "query/CellTable.h"
 #include "query/Database.h"
 #include "query/EventTable.h"
 #include "query/FieldListTable.h"
@@ -32,6 +33,7 @@ void addTimelineTables(Database& database, Timeline& timeline) {
     database.add("main", "sample", sampleTable(timeline));
     database.add("main", "span", spanTable(timeline));
     database.add("main", "state", stateTable(timeline));
+    database.add("main", "cell", cellTable(timeline));
     database.add("main", "event", eventTable(timeline));
     database.add("main", "field", fieldListTable(timeline.fields()));
     if (timeline.fields().size() == 0) {

@@ -17,6 +17,7 @@ struct FieldValue;
 /// Adds the tables of a timeline, which must outlive the database:
 ///
 /// - `packet`, `event`, `field`: the packets, what happened, and what the fields are;
+/// - `cell`: the cells that were served or seen, in each role;
 /// - `sample`: every value that was read; `span`: every time that a value held;
 /// - `state`: a row for each display tick, with a column for each field that is in no list, and a
 ///   hidden one with its age;
