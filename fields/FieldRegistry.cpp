@@ -76,6 +76,10 @@ void addRow(FieldInfo& info, Numbers& numbers, const FieldDescription& field, Lo
     }
     addLabel(info.labels, conversion.exceptionalText);
     addLabel(info.labels, conversion.beyond);
+    if (!conversion.labels.empty() || !conversion.exceptionalText.empty() ||
+        !conversion.beyond.empty()) {
+        info.labelled.push_back(conversion);
+    }
     if (field.condition && field.condition->otherwise.find('%') == std::string_view::npos) {
         addLabel(info.labels, field.condition->otherwise);
     }
@@ -228,6 +232,20 @@ private:
 };
 
 } // namespace
+
+std::string_view FieldInfo::labelOf(std::int64_t raw) const {
+    std::string_view unknown;
+    for (const Conversion& conversion : labelled) {
+        const SampleValue value = conversion.valueOf(raw);
+        if (value.number() == nullptr && value.words() != conversion.beyond) {
+            return value.words();
+        }
+        if (value.number() == nullptr && unknown.empty()) {
+            unknown = value.words(); // another row may know the number
+        }
+    }
+    return unknown;
+}
 
 FieldRegistry::FieldRegistry(const TechnologyReference& technology)
     : _fields(Gatherer(technology).gathered()) {

@@ -46,6 +46,11 @@ struct FieldInfo {
     bool isPersonal = false; ///< identifies a person, a device or a subscription
     bool isShown = true;
     std::vector<FieldId> rows; ///< in the technology's layouts
+    /// How its rows show raw numbers, where some have labels.
+    std::vector<Conversion> labelled;
+
+    /// The label of a raw number; empty if the number is shown itself, or not at all.
+    std::string_view labelOf(std::int64_t raw) const;
 };
 
 /// All fields of one technology, in the order of its display.

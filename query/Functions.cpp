@@ -5,8 +5,11 @@
 #include "knowledge/Channels.h"
 #include "knowledge/Networks.h"
 #include "query/Database.h"
+#include "query/FieldNames.h"
+#include "query/TimelineTables.h"
 #include "text/Date.h"
 #include "text/Format.h"
+#include "text/Suggestion.h"
 
 #include <algorithm>
 #include <chrono>
@@ -114,21 +117,83 @@ QueryValue timeText(Arguments arguments) {
     return isoTimeText(Time(std::chrono::microseconds(std::clamp<std::int64_t>(*time, 0, latest))));
 }
 
+/// What fields measure, by the names that queries give them.
+class MeasureNames {
+public:
+    explicit MeasureNames(const FieldTable* fields) : _fields(fields) {}
+
+    /// Nothing for a field that no profile can judge.
+    std::optional<Measure> find(const std::string& name) {
+        auto found = _found.find(name);
+        if (found == _found.end()) {
+            found = _found.emplace(name, read(name)).first;
+        }
+        return found->second;
+    }
+
+private:
+    std::optional<Measure> read(const std::string& name) const {
+        if (const auto measure = measureOf(name)) {
+            return measure;
+        }
+        if (const auto measure = measureNamed(name)) {
+            return measure;
+        }
+        std::optional<Measure> measure;
+        std::vector<std::string> names;
+        for (const MeasuredField& field : measuredFields()) {
+            if (_fields != nullptr && !_fields->named(field.name)) {
+                continue; // of another technology
+            }
+            names.push_back(lastWordOf(std::string(field.name)));
+            if (names.back() != name) {
+                continue;
+            }
+            if (measure && *measure != field.measure) {
+                throw std::invalid_argument(
+                    formatText("\"%@\" can be \"%@\" or \"%@\"",
+                               {name, infoOf(*measure).name, infoOf(field.measure).name}));
+            }
+            measure = field.measure;
+        }
+        if (!measure && (_fields == nullptr || FieldNames(*_fields).all(name).empty())) {
+            throw std::invalid_argument(unknown(name, std::move(names)));
+        }
+        return measure;
+    }
+    std::string unknown(std::string_view name, std::vector<std::string> names) const {
+        for (const MeasureInfo& each : kMeasures) {
+            names.emplace_back(each.name);
+        }
+        return _fields != nullptr
+                   ? unknownField(*_fields, name, std::move(names))
+                   : formatText("\"%@\" is not a field", {name}) + suggestion(name, names);
+    }
+
+    const FieldTable* _fields;
+    std::map<std::string, std::optional<Measure>, std::less<>> _found; ///< asked for each row
+};
+
 /// Judges values by profiles, each of which it asks for once.
 class Judge {
 public:
-    explicit Judge(QueryKnowledge knowledge) : _knowledge(std::move(knowledge)) {}
+    Judge(QueryKnowledge knowledge, const FieldTable* fields)
+        : _knowledge(std::move(knowledge)), _measures(fields) {}
 
     QueryValue quality(Arguments arguments) {
         const auto* field = std::get_if<std::string>(&arguments[0]);
-        const auto value = realIn(arguments[1]);
         const auto* named =
             arguments.size() > 2 ? std::get_if<std::string>(&arguments[2]) : nullptr;
-        if (field == nullptr || !value || (arguments.size() > 2 && named == nullptr)) {
+        if (field == nullptr || (arguments.size() > 2 && named == nullptr)) {
+            return {};
+        }
+        const auto measure = _measures.find(*field);
+        const auto value = realIn(arguments[1]);
+        if (!measure || !value) {
             return {};
         }
         const auto grade =
-            qualityOf(profile(named != nullptr ? *named : kDefaultProfile), *field, *value);
+            profile(named != nullptr ? *named : kDefaultProfile).gradeOf(*measure, *value);
         return grade ? QueryValue(std::string(nameOf(*grade))) : QueryValue();
     }
 
@@ -146,12 +211,13 @@ private:
     }
 
     QueryKnowledge _knowledge;
+    MeasureNames _measures;
     std::map<std::string, QualityProfile, std::less<>> _profiles;
 };
 
 } // namespace
 
-void addFunctions(Database& database, QueryKnowledge knowledge) {
+void addFunctions(Database& database, QueryKnowledge knowledge, const FieldTable* fields) {
     constexpr int kThree = 3;
     database.addFunction("band", 2, band);
     database.addFunction("mhz", 2, mhz);
@@ -160,7 +226,7 @@ void addFunctions(Database& database, QueryKnowledge knowledge) {
     database.addFunction("operator", 2, [names = knowledge.names](Arguments arguments) {
         return operatorName(arguments, names());
     });
-    const auto judge = std::make_shared<Judge>(std::move(knowledge));
+    const auto judge = std::make_shared<Judge>(std::move(knowledge), fields);
     const auto quality = [judge](Arguments arguments) { return judge->quality(arguments); };
     database.addFunction("quality", 2, quality);
     database.addFunction("quality", kThree, quality);

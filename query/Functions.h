@@ -10,6 +10,7 @@
 namespace pallax {
 
 class Database;
+class FieldTable;
 class NetworkNames;
 
 /// What the functions know beside tables of their own.
@@ -28,8 +29,13 @@ struct QueryKnowledge {
 /// - operator(mcc, mnc): the name of a network; an MNC is a text of two or three digits, or a
 ///   number, which stands for two;
 /// - cell_site(technology, identity): the eNodeB or the RNC of a cell identity;
-/// - quality(field, value) and quality(field, value, profile): "good";
+/// - quality(field, value) and quality(field, value, profile): "good"; the field goes by its name,
+///   its last word or what it measures ("rsrp"). Only a field that no profile can judge gives NULL;
+///   a name that is none, or has several measures, is an error;
 /// - time_text(time): "2023-11-14T22:13:20.000Z".
-void addFunctions(Database& database, QueryKnowledge knowledge);
+///
+/// `fields` are those of the recording and must outlive the database; without them, quality() knows
+/// the fields of all technologies.
+void addFunctions(Database& database, QueryKnowledge knowledge, const FieldTable* fields = nullptr);
 
 } // namespace pallax

@@ -20,6 +20,9 @@ struct Column {
         TimeStamp,    ///< UTC in microseconds: where in the recording they are
         PacketNumber, ///< likewise, by the packet's number
         FieldName,    ///< of which field they tell, by its name
+        // Of a table that is called like a function, series('field', 100); hidden, in their order:
+        FieldArgument, ///< the name of a field, without which there are no rows
+        CountArgument, ///< a whole number, which can be left out
     };
 
     std::string name;
@@ -34,7 +37,8 @@ struct RowBounds {
     std::uint64_t lastPacket = std::numeric_limits<std::uint64_t>::max();
     std::int64_t leastTime = std::numeric_limits<std::int64_t>::min(); ///< as in the column
     std::int64_t mostTime = std::numeric_limits<std::int64_t>::max();
-    std::optional<std::string> field;
+    std::optional<std::string> field = std::nullopt;
+    std::optional<std::int64_t> count = std::nullopt;
 };
 
 /// Takes the value of one column. What is not given is NULL.

@@ -14,11 +14,13 @@ class Timeline;
 struct FieldInfo;
 struct FieldValue;
 
-/// Adds the tables of a timeline, which must outlive the database:
+/// Adds the tables of a timeline, which must outlive the database, and label(field, raw), the label
+/// of a raw number:
 ///
 /// - `packet`, `event`, `field`: the packets, what happened, and what the fields are;
 /// - `cell`: the cells that were served or seen, in each role;
 /// - `sample`: every value that was read; `span`: every time that a value held;
+/// - series(field, buckets): a field over the whole timeline;
 /// - `state`: a row for each display tick, with a column for each field that is in no list, and a
 ///   hidden one with its age;
 /// - a table for each section and each list in it, in a schema with the name of the technology, a

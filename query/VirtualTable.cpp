@@ -83,7 +83,10 @@ char letterOf(Column::Role role) {
     case Column::Role::PacketNumber:
         return 'p';
     case Column::Role::FieldName:
+    case Column::Role::FieldArgument:
         return 'f';
+    case Column::Role::CountArgument:
+        return 'c';
     case Column::Role::Plain:
         break;
     }
@@ -111,7 +114,7 @@ double shareOf(char letter, char bound) {
     constexpr double kRange = 0.25;
     constexpr double kOneField = 0.02;
     constexpr double kOnePlace = 0.0001;
-    return bound != '=' ? kRange : letter == 'f' ? kOneField : kOnePlace;
+    return bound != '=' ? kRange : letter == 'f' ? kOneField : letter == 'c' ? 1.0 : kOnePlace;
 }
 
 /// Chooses the conditions that bound the rows. The plan is a text of two characters for each:
@@ -128,7 +131,8 @@ int chooseBounds(sqlite3_vtab* table, sqlite3_index_info* info) {
         const auto column = static_cast<std::size_t>(constraint.iColumn);
         const char letter = letterOf(asked.columns().at(column).role);
         const char bound = boundOf(constraint.op);
-        if (letter == '\0' || bound == '\0' || (letter == 'f' && bound != '=')) {
+        const bool isRange = letter == 't' || letter == 'p';
+        if (letter == '\0' || bound == '\0' || (!isRange && bound != '=')) {
             continue;
         }
         plan += {letter, bound};
@@ -186,6 +190,10 @@ void bound(RowBounds& bounds, char letter, char how, sqlite3_value* value) {
     }
     if (type != SQLITE_INTEGER && type != SQLITE_FLOAT) {
         return; // NULL, or a text: SQLite decides
+    }
+    if (letter == 'c') {
+        bounds.count = sqlite3_value_int64(value);
+        return;
     }
     const Around around(value);
     if (how != '<') {

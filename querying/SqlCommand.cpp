@@ -168,7 +168,7 @@ ExitStatus runSql(const SqlOptions& options) {
     }
     Database database;
     addTimelineTables(database, (*recorded)->timeline());
-    addFunctions(database, knowledge());
+    addFunctions(database, knowledge(), &(*recorded)->timeline().fields());
     auto query = database.prepare(question->query);
     if (!query) {
         complain(queryErrorText(query.error(), question->query, database.names()));

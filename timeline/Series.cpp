@@ -2,18 +2,21 @@
 
 #include <algorithm>
 #include <functional>
+#include <map>
+#include <optional>
 
 namespace pallax {
 
 namespace {
 
-/// Gives the readings of one field and entry.
+/// Gives the readings of one field, in all entries.
 class FieldReader final : public SampleSink, private CurrentValues::Listener {
 public:
-    using Take = std::function<void(const SamplePacket& packet, const FieldValue& value)>;
+    using Take =
+        std::function<void(const SamplePacket& packet, EntryId entry, const FieldValue& value)>;
 
-    FieldReader(Timeline& timeline, FieldIndex field, EntryId entry, Take take)
-        : _values(timeline.fieldTable(), timeline.entryTable()), _field(field), _entry(entry),
+    FieldReader(Timeline& timeline, FieldIndex field, Take take)
+        : _values(timeline.fieldTable(), timeline.entryTable()), _field(field),
           _take(std::move(take)) {
         _values.setListener(this);
     }
@@ -34,8 +37,8 @@ public:
 
 private:
     void valueRead(FieldIndex field, EntryId entry, const FieldValue& value) override {
-        if (field == _field && entry == _entry) {
-            _take(_packet, value);
+        if (field == _field) {
+            _take(_packet, entry, value);
         }
     }
     void valueRemoved(FieldIndex /*field*/) override {}
@@ -43,7 +46,6 @@ private:
 
     CurrentValues _values;
     FieldIndex _field;
-    EntryId _entry;
     Take _take;
     SamplePacket _packet;
 };
@@ -127,25 +129,50 @@ std::vector<std::uint64_t> bordersOf(const std::vector<Stamp>& stamps, bool isBy
     return borders;
 }
 
-std::vector<Bucket> decodedBuckets(Timeline& timeline, FieldIndex field, EntryId entry,
-                                   const std::vector<Stamp>& stamps, std::size_t count) {
+/// Each entry with its buckets; by default, those that have values.
+std::vector<EntryBuckets> decodedBuckets(Timeline& timeline, FieldIndex field,
+                                         const std::vector<Stamp>& stamps, std::size_t count,
+                                         std::optional<EntryId> only) {
     const std::uint64_t from = stamps.front().packet;
     const std::uint64_t to = stamps.back().packet;
     const auto borders = bordersOf(stamps, isInOneStretch(timeline, from, to), to + 1, count);
-    std::vector<Bucket> buckets;
+    std::vector<Bucket> empty;
     for (std::size_t index = 0; index + 1 < borders.size(); ++index) {
-        buckets.push_back({borders[index], borders[index + 1], stamps[borders[index] - from].time});
+        empty.push_back({borders[index], borders[index + 1], stamps[borders[index] - from].time});
     }
-    auto bucket = buckets.begin();
-    FieldReader reader(timeline, field, entry,
-                       [&](const SamplePacket& packet, const FieldValue& value) {
-                           while (bucket->to <= packet.number) {
+    std::map<EntryId, std::vector<Bucket>> ofEntries;
+    if (only) {
+        ofEntries.emplace(*only, empty);
+    }
+    std::size_t bucket = 0;
+    FieldReader reader(timeline, field,
+                       [&](const SamplePacket& packet, EntryId entry, const FieldValue& value) {
+                           while (empty[bucket].to <= packet.number) {
                                ++bucket;
                            }
-                           bucket->add(timeline.seriesValueOf(value));
+                           if (!only || entry == *only) {
+                               auto& buckets = ofEntries.try_emplace(entry, empty).first->second;
+                               buckets[bucket].add(timeline.seriesValueOf(value));
+                           }
                        });
     (void)timeline.read(from, to, reader);
-    return buckets;
+    std::vector<EntryBuckets> all;
+    for (auto& [entry, buckets] : ofEntries) {
+        all.push_back({entry, std::move(buckets)});
+    }
+    return all;
+}
+
+/// The borders of buckets that the timeline's reduction can answer.
+std::vector<std::uint64_t> keptBorders(const Timeline& timeline, std::uint64_t from,
+                                       std::uint64_t to, std::size_t count) {
+    const SeriesStore& store = timeline.series();
+    std::vector<Stamp> cells;
+    for (std::uint64_t packet = store.cellStart(from); packet <= to; packet += store.cellSize()) {
+        cells.push_back({packet, store.cellTime(packet)});
+    }
+    return bordersOf(cells, isInOneStretch(timeline, from, to),
+                     cells.back().packet + store.cellSize(), count);
 }
 
 } // namespace
@@ -154,9 +181,11 @@ std::vector<SeriesPoint> readSeries(Timeline& timeline, FieldIndex field, EntryI
                                     std::uint64_t from, std::uint64_t to,
                                     const MayContinue& mayContinue) {
     std::vector<SeriesPoint> points;
-    FieldReader reader(timeline, field, entry,
-                       [&points](const SamplePacket& packet, const FieldValue& value) {
-                           points.push_back({packet.number, packet.time, value});
+    FieldReader reader(timeline, field,
+                       [&](const SamplePacket& packet, EntryId ofEntry, const FieldValue& value) {
+                           if (ofEntry == entry) {
+                               points.push_back({packet.number, packet.time, value});
+                           }
                        });
     (void)timeline.read(from, to, reader, mayContinue);
     return points;
@@ -169,19 +198,36 @@ std::vector<Bucket> readBuckets(Timeline& timeline, FieldIndex field, EntryId en
     if (from > to || count == 0) {
         return {};
     }
-    const SeriesStore& store = timeline.series();
+    if (to - from >= kMostDecoded) {
+        return timeline.series().buckets(field, entry, keptBorders(timeline, from, to, count));
+    }
+    const std::vector<Stamp> stamps = stampsOf(timeline, from, to);
+    return stamps.empty() ? std::vector<Bucket>()
+                          : decodedBuckets(timeline, field, stamps, count, entry).front().buckets;
+}
+
+std::vector<EntryBuckets> readBucketsOfEntries(Timeline& timeline, FieldIndex field,
+                                               std::size_t count) {
+    const std::uint64_t from = timeline.firstInstant() + 1;
+    const std::uint64_t to = timeline.packets();
+    if (from > to || count == 0) {
+        return {};
+    }
     if (to - from < kMostDecoded) {
         const std::vector<Stamp> stamps = stampsOf(timeline, from, to);
-        return stamps.empty() ? std::vector<Bucket>()
-                              : decodedBuckets(timeline, field, entry, stamps, count);
+        return stamps.empty() ? std::vector<EntryBuckets>()
+                              : decodedBuckets(timeline, field, stamps, count, std::nullopt);
     }
-    std::vector<Stamp> cells;
-    for (std::uint64_t packet = store.cellStart(from); packet <= to; packet += store.cellSize()) {
-        cells.push_back({packet, store.cellTime(packet)});
+    const SeriesStore& store = timeline.series();
+    const auto borders = keptBorders(timeline, from, to, count);
+    std::vector<EntryBuckets> all;
+    for (const EntryId entry : store.entriesOf(field)) {
+        all.push_back({entry, store.buckets(field, entry, borders)});
     }
-    const std::uint64_t end = cells.back().packet + store.cellSize();
-    return store.buckets(field, entry,
-                         bordersOf(cells, isInOneStretch(timeline, from, to), end, count));
+    if (all.empty()) {
+        all.push_back({kNoEntry, store.buckets(field, kNoEntry, borders)});
+    }
+    return all;
 }
 
 } // namespace pallax

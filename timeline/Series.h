@@ -30,4 +30,15 @@ std::vector<SeriesPoint> readSeries(Timeline& timeline, FieldIndex field, EntryI
 std::vector<Bucket> readBuckets(Timeline& timeline, FieldIndex field, EntryId entry,
                                 std::uint64_t from, std::uint64_t to, std::size_t count);
 
+/// The buckets of one entry.
+struct EntryBuckets {
+    EntryId entry = kNoEntry; ///< outside lists
+    std::vector<Bucket> buckets;
+};
+
+/// The buckets of a field over all packets, as above, for each entry that has values. They are read
+/// together: all have the same borders.
+std::vector<EntryBuckets> readBucketsOfEntries(Timeline& timeline, FieldIndex field,
+                                               std::size_t count);
+
 } // namespace pallax

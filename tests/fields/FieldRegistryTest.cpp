@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <array>
 #include <map>
 #include <set>
 #include <string>
@@ -63,6 +64,23 @@ TEST(FieldRegistry, ARangeIsOfTheNumbersThatAreShown) {
     ASSERT_NE(gain, nullptr);
     EXPECT_EQ(gain->least, -3276.8) << "tenths of 16 bits";
     EXPECT_EQ(gain->most, 3276.7);
+}
+
+TEST(FieldRegistry, ALabelComesFromTheFirstRowThatKnowsTheNumber) {
+    static constexpr std::array<std::string_view, 2> kShort{"Idle", "Busy"};
+    static constexpr std::array<std::string_view, 3> kLong{"idle", "busy", "Lost"};
+    FieldInfo field;
+    EXPECT_EQ(field.labelOf(0), "");
+    field.labelled = {Conversion::label(kShort, "Unknown"),
+                      Conversion::label(kLong, "?").except(9, "None")};
+    EXPECT_EQ(field.labelOf(1), "Busy");
+    EXPECT_EQ(field.labelOf(2), "Lost");
+    EXPECT_EQ(field.labelOf(9), "None");
+    EXPECT_EQ(field.labelOf(3), "Unknown");
+    EXPECT_EQ(field.labelOf(-1), "Unknown");
+    field.labelled = {Conversion::number().except(0, "Not Present")};
+    EXPECT_EQ(field.labelOf(0), "Not Present");
+    EXPECT_EQ(field.labelOf(1), "");
 }
 
 TEST(FieldRegistry, KnowsAFieldOfASection) {

@@ -60,11 +60,54 @@ TEST_F(FunctionsTest, JudgeAFieldByANamedProfile) {
     };
     EXPECT_EQ(ask("quality(" + rsrp + ", -97), quality(" + rsrp + ", -97.0, 'field')"),
               Lines{grade(*android, -97) + "|" + grade(*field, -97)});
-    EXPECT_EQ(ask("quality('lte.serving_cell_info.version', 1), quality(" + rsrp +
-                  ", null), quality(" + rsrp + ", 'x'), quality(" + rsrp + ", -97, null)"),
+    EXPECT_EQ(ask("quality(" + rsrp + ", null), quality(" + rsrp + ", 'x'), quality(" + rsrp +
+                  ", -97, null), quality(null, -97)"),
               Lines{"NULL|NULL|NULL|NULL"});
     EXPECT_EQ(ask("quality(" + rsrp + ", -97, 'nowhere')"),
               Lines{"there is no profile \"nowhere\""});
+}
+
+TEST_F(FunctionsTest, JudgeAFieldByItsLastWordOrByWhatItMeasures) {
+    const Lines full = ask("quality('lte.serving_cell_measurements.measured_rsrp', -97)");
+    EXPECT_EQ(ask("quality('rsrp', -97)"), full);
+    EXPECT_EQ(ask("quality('measured_rsrp', -97)"), full) << "of two sections, in one measure";
+    EXPECT_EQ(ask("quality('rssi', -97)"), ask("quality('lte.neighbor_cells_list.measured_rssi', "
+                                               "-97)"))
+        << "a measure comes before a last word";
+    EXPECT_EQ(ask("quality('rspr', -97)"),
+              Lines{"\"rspr\" is not a field. Did you mean \"rsrp\"?"});
+    EXPECT_EQ(ask("quality('active_set', -9)"), Lines{"excellent"});
+}
+
+TEST(FunctionsOfARecording, KnowItsFields) {
+    QueryFixture fixture("lte", 7, std::chrono::seconds(20));
+    addFunctions(
+        fixture.database,
+        {[] { return nullptr; }, [](std::string_view name) { return builtInProfile(name); }},
+        &fixture.timeline->fields());
+    const auto ask = [&](const std::string& expression) {
+        return fixture.ask("select " + expression);
+    };
+    EXPECT_EQ(ask("quality('rsrp', -97)"), ask("quality('average_rsrp', -97)"));
+    EXPECT_EQ(ask("quality('lte.serving_cell_measurements.version', 1), quality('srxlev', 1)"),
+              Lines{"NULL|NULL"})
+        << "no profile judges them";
+    EXPECT_EQ(ask("quality('srxlve', 1)"),
+              Lines{"\"srxlve\" is not a field. Did you mean \"srxlev\"?"});
+    EXPECT_EQ(ask("quality('lte.serving_cell_measurement.version', 1)"),
+              Lines{"\"lte.serving_cell_measurement.version\" is not a field. Did you mean "
+                    "\"lte.serving_cell_measurements.version\"?"});
+    EXPECT_EQ(ask("quality('active_set', -9)"), Lines{"\"active_set\" is not a field"})
+        << "it is one of another technology";
+    EXPECT_EQ(ask("label('download_bandwidth', 5), label('download_bandwidth', 100)"),
+              Lines{"Unknown|20 MHz"});
+    EXPECT_EQ(ask("label('p_max', 5), label(null, 1), label('p_max', null), label('p_max', 'x')"),
+              Lines{"NULL|NULL|NULL|NULL"});
+    EXPECT_EQ(ask("label('measured_rsrp', 1)"),
+              Lines{"\"measured_rsrp\" can be \"lte.serving_cell_measurements.measured_rsrp\" or "
+                    "\"lte.neighbor_cells_list.measured_rsrp\""});
+    EXPECT_EQ(ask("label('dowload_bandwidth', 1)"),
+              Lines{"\"dowload_bandwidth\" is not a field. Did you mean \"download_bandwidth\"?"});
 }
 
 TEST_F(FunctionsTest, TellTimes) {
