@@ -12,33 +12,41 @@ namespace pallax {
 
 namespace {
 
-/// Of the memory of all queries.
-constexpr sqlite3_int64 kMostMemory = sqlite3_int64{256} << 20U;
+/// Of the memory of all queries, sorting included. SQLite writes no temporary file.
+constexpr sqlite3_int64 kMostMemory = sqlite3_int64{512} << 20U;
 /// Of a text or a query.
 constexpr int kLongestText = 16 << 20;
 constexpr int kStepsBetweenQuestions = 4000;
+constexpr const char* kOnlyReading = "A query can only read.";
 
 bool isHarmless(std::string_view function) {
     return function != "load_extension" && function != "fts3_tokenizer";
 }
 
-/// Allows what only reads. It is asked while a query is prepared; a table that is opened then is
-/// declared meanwhile.
-int authorize(void* isDeclaring, int action, const char* /*first*/, const char* second,
-              const char* /*schema*/, const char* /*inner*/) {
-    if (*static_cast<bool*>(isDeclaring)) {
-        return SQLITE_OK;
-    }
+/// Whether an action only reads.
+bool isReading(int action, const char* second) {
     switch (action) {
     case SQLITE_SELECT:
     case SQLITE_READ:
     case SQLITE_RECURSIVE:
-        return SQLITE_OK;
+        return true;
     case SQLITE_FUNCTION:
-        return isHarmless(second != nullptr ? second : "") ? SQLITE_OK : SQLITE_DENY;
+        return isHarmless(second != nullptr ? second : "");
     default:
-        return SQLITE_DENY;
+        return false;
     }
+}
+
+/// Allows what only reads. It is asked while a query is prepared; a table that is opened then is
+/// declared meanwhile.
+int authorize(void* data, int action, const char* /*first*/, const char* second,
+              const char* /*schema*/, const char* /*inner*/) {
+    auto& authority = *static_cast<Authority*>(data);
+    if (authority.isDeclaring || isReading(action, second)) {
+        return SQLITE_OK;
+    }
+    authority.hasRefused = true;
+    return SQLITE_DENY;
 }
 
 int askWhetherToStop(void* mayContinue) {
@@ -48,11 +56,32 @@ int askWhetherToStop(void* mayContinue) {
 QueryError errorOf(sqlite3& connection) {
     const int place = sqlite3_error_offset(&connection);
     const int code = sqlite3_errcode(&connection);
-    std::string sentence = code == SQLITE_AUTH        ? "A query can only read."
+    std::string sentence = code == SQLITE_AUTH        ? kOnlyReading
                            : code == SQLITE_INTERRUPT ? "The query was stopped."
-                                                      : sqlite3_errmsg(&connection);
+                           : code == SQLITE_NOMEM ? "The query needs more than 512 MiB of memory."
+                                                  : sqlite3_errmsg(&connection);
     return {std::move(sentence),
             place >= 0 ? std::optional(static_cast<std::size_t>(place)) : std::nullopt};
+}
+
+std::string_view bytesOf(sqlite3_value* value) {
+    const auto* bytes = static_cast<const char*>(sqlite3_value_blob(value));
+    const auto length = static_cast<std::size_t>(sqlite3_value_bytes(value));
+    return bytes != nullptr ? std::string_view(bytes, length) : std::string_view();
+}
+
+std::string hexadecimal(std::string_view bytes) {
+    constexpr std::string_view kDigits = "0123456789ABCDEF";
+    constexpr unsigned kBitsPerDigit = 4;
+    constexpr unsigned kLastDigit = 0xF;
+    std::string digits;
+    digits.reserve(bytes.size() * 2);
+    for (const char character : bytes) {
+        const auto byte = static_cast<unsigned char>(character);
+        digits += kDigits[byte >> kBitsPerDigit];
+        digits += kDigits[byte & kLastDigit];
+    }
+    return digits;
 }
 
 QueryValue valueOf(sqlite3_value* value) {
@@ -63,11 +92,10 @@ QueryValue valueOf(sqlite3_value* value) {
         return sqlite3_value_double(value);
     case SQLITE_NULL:
         return {};
-    default: {
-        const auto* text = static_cast<const char*>(sqlite3_value_blob(value));
-        const auto length = static_cast<std::size_t>(sqlite3_value_bytes(value));
-        return text != nullptr ? std::string(text, length) : std::string();
-    }
+    case SQLITE_BLOB:
+        return hexadecimal(bytesOf(value));
+    default:
+        return std::string(bytesOf(value));
     }
 }
 
@@ -137,7 +165,7 @@ void Database::Close::operator()(sqlite3* connection) const {
     sqlite3_close_v2(connection);
 }
 
-Database::Database() : _schemas{"main"} {
+Database::Database() : _authority(std::make_unique<Authority>()), _schemas{"main"} {
     sqlite3* connection = nullptr;
     const int result = sqlite3_open_v2(":memory:", &connection,
                                        SQLITE_OPEN_READWRITE | SQLITE_OPEN_MEMORY, nullptr);
@@ -148,6 +176,9 @@ Database::Database() : _schemas{"main"} {
     sqlite3_hard_heap_limit64(kMostMemory);
     sqlite3_limit(connection, SQLITE_LIMIT_LENGTH, kLongestText);
     sqlite3_limit(connection, SQLITE_LIMIT_SQL_LENGTH, kLongestText);
+    run(*connection, "PRAGMA temp_store = memory");
+    // Opens them while that is allowed; later they only read.
+    run(*connection, "SELECT 1 FROM json_each('[]'), json_tree('[]')");
     if (!addQuantile(*connection)) {
         throw std::runtime_error(sqlite3_errmsg(connection));
     }
@@ -166,12 +197,20 @@ void Database::add(const std::string& schema, const std::string& name,
     for (const Column& column : table->columns()) {
         _names.push_back(column.name);
     }
-    _tables.push_back(std::move(table));
-    _added.push_back(std::make_unique<AddedTable>(AddedTable{*_tables.back(), _isDeclaring}));
+    _tables.push_back({schema, name, std::move(table)});
+    _added.push_back(std::make_unique<AddedTable>(AddedTable{*_tables.back().table, *_authority}));
     const std::string qualified = "\"" + schema + "\".\"" + name + "\"";
     if (!addVirtualTable(*_connection, qualified.c_str(), *_added.back())) {
         throw std::runtime_error(sqlite3_errmsg(_connection.get()));
     }
+}
+
+std::vector<Database::Table> Database::tables() const {
+    std::vector<Table> tables;
+    for (const Named& each : _tables) {
+        tables.push_back({each.schema, each.name, each.table->columns()});
+    }
+    return tables;
 }
 
 void Database::addFunction(const char* name, int arguments, Function function) {
@@ -191,18 +230,26 @@ void Database::setMayContinue(std::function<bool()> mayContinue) {
 }
 
 Result<Query, QueryError> Database::prepare(std::string_view text) {
-    sqlite3_set_authorizer(_connection.get(), authorize, &_isDeclaring);
+    sqlite3_set_authorizer(_connection.get(), authorize, _authority.get());
+    _authority->hasRefused = false;
     sqlite3_stmt* statement = nullptr;
     const char* rest = nullptr;
     const auto length = static_cast<int>(std::min<std::size_t>(text.size(), kLongestText));
     const int result =
         sqlite3_prepare_v2(_connection.get(), text.data(), length, &statement, &rest);
     std::unique_ptr<sqlite3_stmt, Query::Finalize> owned(statement);
+    if (_authority->hasRefused) {
+        return QueryError{kOnlyReading, std::nullopt};
+    }
     if (result != SQLITE_OK) {
         return errorOf(*_connection);
     }
     if (!owned) {
         return QueryError{"There is no query.", std::nullopt};
+    }
+    // VACUUM and the like ask for nothing before they run.
+    if (sqlite3_stmt_readonly(owned.get()) == 0 || sqlite3_column_count(owned.get()) == 0) {
+        return QueryError{kOnlyReading, std::nullopt};
     }
     const auto end = static_cast<std::size_t>(rest - text.data());
     if (text.find_first_not_of(" \t\r\n;", end) != std::string_view::npos) {

@@ -18,8 +18,10 @@ struct sqlite3_stmt;
 
 namespace pallax {
 
-class QueryTable;
 struct AddedTable;
+struct Authority;
+struct Column;
+class QueryTable;
 
 /// Why a query cannot be run or has been stopped.
 struct QueryError {
@@ -27,7 +29,8 @@ struct QueryError {
     std::optional<std::size_t> place; ///< in the text of the query, in bytes
 };
 
-/// A value of a result: NULL, an integer, a real number, or a text.
+/// A value of a result: NULL, an integer, a real number, or a text. Bytes come as a text of
+/// hexadecimal digits, as of hex().
 using QueryValue = std::variant<std::monostate, std::int64_t, double, std::string>;
 
 /// A query that runs.
@@ -69,7 +72,14 @@ public:
     /// Adds a function of that many arguments; -1 for any number. Its value must depend on nothing
     /// but them.
     void addFunction(const char* name, int arguments, Function function);
-    /// The names of all tables and their columns, for suggestions.
+    struct Table {
+        std::string schema;
+        std::string name;
+        const std::vector<Column>& columns;
+    };
+    /// All tables, in the order in which they were added.
+    std::vector<Table> tables() const;
+    /// The names of all tables, columns and functions, for suggestions.
     const std::vector<std::string>& names() const { return _names; }
     /// Asked every few thousand steps of a query; false stops it.
     void setMayContinue(std::function<bool()> mayContinue);
@@ -82,12 +92,18 @@ private:
         void operator()(sqlite3* connection) const;
     };
 
+    struct Named {
+        std::string schema;
+        std::string name;
+        std::unique_ptr<QueryTable> table;
+    };
+
     // These outlive the connection.
-    std::vector<std::unique_ptr<QueryTable>> _tables;
+    std::vector<Named> _tables;
     std::vector<std::unique_ptr<AddedTable>> _added;
     std::vector<std::unique_ptr<Function>> _functions;
     std::vector<std::string> _names;
-    bool _isDeclaring = false;
+    std::unique_ptr<Authority> _authority;
 
     std::unique_ptr<sqlite3, Close> _connection;
     std::vector<std::string> _schemas;

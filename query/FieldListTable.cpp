@@ -11,7 +11,7 @@ const std::vector<Column>& fieldColumns() {
         {"name", "TEXT"},       {"path", "TEXT"},          {"kind", "TEXT"},
         {"unit", "TEXT"},       {"least", "REAL"},         {"most", "REAL"},
         {"in_list", "INTEGER"}, {"identifies", "INTEGER"}, {"personal", "INTEGER"},
-        {"meaning", "TEXT"},
+        {"meaning", "TEXT"},    {"shown", "INTEGER"},
     };
     return columns;
 }
@@ -28,7 +28,8 @@ public:
         kInList,
         kIdentifies,
         kPersonal,
-        kMeaning
+        kMeaning,
+        kShown
     };
 
     explicit FieldRows(const FieldTable& fields) : _fields(fields) {}
@@ -55,8 +56,10 @@ public:
             return value.integer(field.identifies ? 1 : 0);
         case kPersonal:
             return value.integer(field.isPersonal ? 1 : 0);
-        default:
+        case kMeaning:
             return value.text(field.meaning);
+        default:
+            return value.integer(field.isShown ? 1 : 0);
         }
     }
 

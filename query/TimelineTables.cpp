@@ -1,5 +1,6 @@
 #include "query/TimelineTables.h"
 
+#include "query/CatalogTables.h"
 #include "query/CellTable.h"
 #include "query/Database.h"
 #include "query/EventTable.h"
@@ -54,6 +55,8 @@ void addTimelineTables(Database& database, Timeline& timeline) {
     database.add("main", "cell", cellTable(timeline));
     database.add("main", "event", eventTable(timeline));
     database.add("main", "field", fieldListTable(timeline.fields()));
+    database.add("main", "tables", tablesTable(database));
+    database.add("main", "columns", columnsTable(database));
     database.addFunction("label", 2, labelFunction(timeline.fields()));
     if (timeline.fields().size() == 0) {
         return;

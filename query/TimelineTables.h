@@ -18,6 +18,7 @@ struct FieldValue;
 /// of a raw number:
 ///
 /// - `packet`, `event`, `field`: the packets, what happened, and what the fields are;
+/// - `tables`, `columns`: all of these tables;
 /// - `cell`: the cells that were served or seen, in each role;
 /// - `sample`: every value that was read; `span`: every time that a value held;
 /// - series(field, buckets): a field over the whole timeline;

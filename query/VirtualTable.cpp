@@ -62,9 +62,9 @@ int connect(sqlite3* connection, void* data, int /*count*/, const char* const* /
     auto open = std::make_unique<OpenTable>();
     const AddedTable& added = *static_cast<AddedTable*>(data);
     open->table = &added.table;
-    added.isDeclaring = true;
+    added.authority.isDeclaring = true;
     const int result = sqlite3_declare_vtab(connection, declarationOf(added.table).c_str());
-    added.isDeclaring = false;
+    added.authority.isDeclaring = false;
     if (result == SQLITE_OK) {
         *made = open.release();
     }

@@ -6,11 +6,17 @@ namespace pallax {
 
 class QueryTable;
 
+/// What a connection allows.
+struct Authority {
+    /// Set while SQLite reads a table's own declaration, which writes to no file.
+    bool isDeclaring = false;
+    bool hasRefused = false; ///< since it was last set to false
+};
+
 /// A table of a connection.
 struct AddedTable {
     QueryTable& table;
-    /// Set while SQLite reads the table's own declaration, which writes to no file.
-    bool& isDeclaring;
+    Authority& authority;
 };
 
 /// Adds a table under a name that is written as SQL wants it (schema."name"). It must outlive the

@@ -33,11 +33,22 @@ std::string textOf(const QueryValue& value) {
     if (const auto* text = std::get_if<std::string>(&value)) {
         return *text;
     }
+    const auto* real = std::get_if<double>(&value);
+    if (real != nullptr && std::isinf(*real)) {
+        return *real > 0 ? "inf" : "-inf"; // JSON, of which the other numbers are, has none
+    }
     std::string text;
     if (isNumber(value)) {
         appendJson(text, objectOf(value));
     }
     return text;
+}
+
+/// Of a table: in one line, with control characters escaped.
+std::string cellOf(const QueryValue& value) {
+    std::string cell;
+    appendPrintable(cell, textOf(value));
+    return cell;
 }
 
 std::size_t columnsOf(std::string_view text) {
@@ -104,9 +115,9 @@ void RowWriter::writeJson(const std::vector<QueryValue>& row) {
 void RowWriter::writeTableHead() {
     _hasHead = true;
     for (std::size_t column = 0; column < _columns.size(); ++column) {
-        _widths.push_back(columnsOf(_columns[column]));
+        _widths.push_back(columnsOf(cellOf(_columns[column])));
         for (const auto& row : _waiting) {
-            _widths[column] = std::max(_widths[column], columnsOf(textOf(row[column])));
+            _widths[column] = std::max(_widths[column], columnsOf(cellOf(row[column])));
         }
     }
     writeTableRow({_columns.begin(), _columns.end()});
@@ -120,12 +131,12 @@ void RowWriter::writeTableRow(const std::vector<QueryValue>& row) {
     const std::size_t begin = out.size();
     for (std::size_t column = 0; column < row.size(); ++column) {
         constexpr std::string_view kGap = "  ";
-        const std::string text = textOf(row[column]);
-        const std::size_t width = columnsOf(text);
+        const std::string cell = cellOf(row[column]);
+        const std::size_t width = columnsOf(cell);
         const std::size_t missing = _widths[column] > width ? _widths[column] - width : 0;
         out.append(column == 0 ? "" : kGap);
         out.append(isNumber(row[column]) ? missing : 0, ' ');
-        appendValidUtf8(out, text);
+        out.append(cell);
         out.append(isNumber(row[column]) ? 0 : missing, ' ');
     }
     out.erase(std::max(begin, out.find_last_not_of(' ') + 1));

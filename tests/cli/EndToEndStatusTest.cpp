@@ -252,6 +252,7 @@ TEST_F(EndToEndStatus, OfSql) {
           2,
           "pallax: no such column: tme. Did you mean \"time\"? (line 1, column 8 of the query)\n"});
     ends({{"sql", sample, "drop table packet"}, 2, "pallax: A query can only read.\n"});
+    ends({{"sql", sample, "vacuum"}, 2, "pallax: A query can only read.\n"});
     ends({{"sql", "--file", missing, sample},
           1,
           "pallax: " + missing + " cannot be read: No such file or directory.\n"});

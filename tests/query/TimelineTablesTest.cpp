@@ -123,11 +123,50 @@ TEST_P(TimelineTablesTest, ALabelIsThatOfItsRawNumber) {
         Lines{hasRaw ? "1" : "0"});
 }
 
+TEST_P(TimelineTablesTest, AllTablesAndColumnsAreListed) {
+    const std::size_t sections = fieldGroups(_fixture.timeline->fields()).size();
+    EXPECT_EQ(_fixture.ask("select count(*) from tables where schema = '" +
+                           std::string(GetParam()) + "'"),
+              Lines{std::to_string(sections)});
+    EXPECT_EQ(_fixture.ask("select name from tables where schema = 'main'"),
+              (Lines{"packet", "sample", "series", "span", "state", "cell", "event", "field",
+                     "tables", "columns"}));
+    for (const Database::Table& table : _fixture.database.tables()) {
+        const std::string name = table.schema + ".\"" + table.name + "\"";
+        const std::string limit = table.name == "series" ? "('sample') limit 0" : " limit 0";
+        const auto query = _fixture.database.prepare("select * from " + name + limit);
+        ASSERT_TRUE(query) << name;
+        Lines shown;
+        for (const std::string& column : query->columns()) {
+            shown.push_back(column);
+        }
+        EXPECT_EQ(_fixture.ask("select name from columns where schema = '" + table.schema +
+                               "' and table_name = '" + table.name + "' and not hidden"),
+                  shown);
+    }
+    EXPECT_EQ(_fixture.ask("select count(*) from tables t where columns <> (select "
+                           "group_concat(name, ' ') from columns where schema = t.schema and "
+                           "table_name = t.name and not hidden)"),
+              Lines{"0"});
+    EXPECT_NE(_fixture.ask("select count(*) from columns where hidden and name like '%_age'"),
+              Lines{"0"});
+}
+
 TEST_P(TimelineTablesTest, EventsAndFieldsAreTables) {
     EXPECT_EQ(_fixture.ask("select count(*) from event"),
               Lines{std::to_string(_fixture.timeline->events().size())});
     EXPECT_EQ(_fixture.ask("select count(distinct name) from field"),
               Lines{std::to_string(_fixture.timeline->fields().size())});
+    Lines hidden;
+    for (FieldIndex index = 0; index < _fixture.timeline->fields().size(); ++index) {
+        const FieldInfo& field = _fixture.timeline->fields()[index];
+        if (!field.isShown) {
+            hidden.push_back(field.name);
+        }
+    }
+    EXPECT_EQ(_fixture.ask("select name from field where not shown"), hidden);
+    EXPECT_EQ(hidden.empty(),
+              std::string(GetParam()) != "utran" && std::string(GetParam()) != "gsm");
 }
 
 class LteTablesTest : public testing::Test {

@@ -59,6 +59,20 @@ TEST(RowWriter, WritesAnObjectForEachRow) {
     EXPECT_EQ(written(RowFormat::Json, {"x"}, {{INFINITY}}), "{\"x\":null}\n");
 }
 
+TEST(RowWriter, InfinityIsANumberExceptInJson) {
+    const std::vector<Row> row = {{INFINITY, -INFINITY}};
+    EXPECT_EQ(written(RowFormat::Csv, {"a", "b"}, row), "a,b\ninf,-inf\n");
+    EXPECT_EQ(written(RowFormat::Table, {"a", "b"}, row), "a    b\ninf  -inf\n");
+    EXPECT_EQ(written(RowFormat::Json, {"a", "b"}, row), "{\"a\":null,\"b\":null}\n");
+}
+
+TEST(RowWriter, ARowOfATableIsOneLine) {
+    EXPECT_EQ(written(RowFormat::Table, {"a\nb", "c"},
+                      {{std::string("x\ty\r\n"), std::string("\x1B[2J")}}),
+              "a\\x0Ab          c\nx\\x09y\\x0D\\x0A  \\x1B[2J\n");
+    EXPECT_EQ(written(RowFormat::Csv, {"a"}, {{std::string("x\ny")}}), "a\n\"x\ny\"\n");
+}
+
 TEST(RowWriter, WithoutRowsThereIsAHeadAndOfJsonNothing) {
     EXPECT_EQ(written(RowFormat::Table, {"a", "b"}, {}), "a  b\n");
     EXPECT_EQ(written(RowFormat::Csv, {"a", "b"}, {}), "a,b\n");
