@@ -117,6 +117,11 @@ double shareOf(char letter, char bound) {
     return bound != '=' ? kRange : letter == 'f' ? kOneField : letter == 'c' ? 1.0 : kOnePlace;
 }
 
+/// Whether texts are compared byte by byte, not with COLLATE NOCASE.
+bool isExact(sqlite3_index_info& info, int constraint) {
+    return std::string_view(sqlite3_vtab_collation(&info, constraint)) == "BINARY";
+}
+
 /// Chooses the conditions that bound the rows. The plan is a text of two characters for each:
 /// column's role and bound. SQLite checks the conditions itself, too.
 int chooseBounds(sqlite3_vtab* table, sqlite3_index_info* info) {
@@ -132,7 +137,8 @@ int chooseBounds(sqlite3_vtab* table, sqlite3_index_info* info) {
         const char letter = letterOf(asked.columns().at(column).role);
         const char bound = boundOf(constraint.op);
         const bool isRange = letter == 't' || letter == 'p';
-        if (letter == '\0' || bound == '\0' || (!isRange && bound != '=')) {
+        if (letter == '\0' || bound == '\0' || (!isRange && bound != '=') ||
+            (letter == 'f' && !isExact(*info, index))) {
             continue;
         }
         plan += {letter, bound};

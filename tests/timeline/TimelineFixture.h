@@ -28,6 +28,8 @@ public:
     /// Drops the packets before this number.
     void dropBefore(std::uint64_t number) { _first = number; }
     std::uint64_t size() const { return _packets.size(); }
+    /// How many packets its readers have given so far.
+    std::uint64_t given() const { return _given; }
     JournalPacket packet(std::uint64_t number) const {
         const auto& [time, data] = _packets[number - 1];
         return {number, time, data};
@@ -41,19 +43,23 @@ public:
 private:
     class Reader final : public PacketReader {
     public:
-        Reader(const MemoryJournal& journal, std::uint64_t next) : _journal(journal), _next(next) {}
+        Reader(MemoryJournal& journal, std::uint64_t next) : _journal(journal), _next(next) {}
         std::optional<JournalPacket> next() override {
-            return _next <= _journal.size() ? std::optional(_journal.packet(_next++))
-                                            : std::nullopt;
+            if (_next > _journal.size()) {
+                return std::nullopt;
+            }
+            ++_journal._given;
+            return _journal.packet(_next++);
         }
 
     private:
-        const MemoryJournal& _journal;
+        MemoryJournal& _journal;
         std::uint64_t _next;
     };
 
     std::vector<std::pair<Time, ByteBuffer>> _packets;
     std::uint64_t _first = 1;
+    std::uint64_t _given = 0;
 };
 
 /// A journal and what decodes it.
