@@ -13,6 +13,7 @@ constexpr const char* kDecodeFooter = R"(Examples:
   pallax decode --at 14:03:20 drive.pcap
   pallax decode --every tick --from +90s --to -5m drive.pcap
   pallax decode --format csv --select '*.measured_rsrp' drive.pcap
+  pallax decode --every tick --where 'measured_rsrp < -100' drive.pcap
   pallax decode --join drive-0001.pcapng drive-0002.pcapng
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
@@ -32,13 +33,20 @@ or --at.
 A FIELD is a name that pallax fields lists; * stands for any letters. --typed
 writes a number as {"number":-94.75,"unit":"dBm","text":"-94.75 dBm"}.
 
+With --where, only the displays at which a condition holds are written: of the
+ticks, the packets, or the end. It is an expression of SQL on a row of the table
+"state" of pallax sql, with the columns and functions there: time, packet, tick
+(NULL without --every tick), fields (measured_rsrp, or the full name) and their
+ages in seconds (measured_rsrp_age). NULL does not hold. In CSV, the changes are
+then those since the display that was written before.
+
 With --join the recordings must have one technology. They are read in the order
 of their first packets, and each continues the state of the one before.
 
 Exit status:
   0   success, or the reader of the output has gone
   1   failure: cannot read a recording or template, or write the output
-  2   wrong usage
+  2   wrong usage, or a wrong condition
   70  with --strict: ended by a fatal record)";
 
 void addChoices(CLI::App& app, DecodeOptions& options) {
@@ -72,6 +80,8 @@ void addContent(CLI::App& app, DecodeOptions& options) {
         ->expected(1)
         ->take_all()
         ->type_name("FIELD");
+    app.add_option("--where", options.where, "Write only the displays at which this holds")
+        ->type_name("CONDITION");
     app.add_flag("--typed", options.typed, "JSON: numbers with their units, as objects");
     app.add_flag("--recording-column", options.recordingColumn,
                  "CSV: the name of the recording, as the first column");

@@ -41,6 +41,7 @@ Exit status:
 constexpr const char* kEventsFooter = R"(Examples:
   pallax events drive.pcap
   pallax events --json drive.pcap | jq -r 'select(.kind == "ping-pong").time'
+  pallax events --where "kind = 'gap' or measured_rsrp < -110" drive.pcap
   modem-dump | pallax events -
 
 A line has the local time, the kind and the words of an event: cell-change,
@@ -50,13 +51,17 @@ gap (no packets for a minute), time-step (the clock was set back) or
 fatal-record. In JSON, the time is UTC, "packet" is the packet that shows the
 event, and "fields" names its fields. What a modem does not tell has no events.
 
+With --where, only the events for which a condition holds are listed. It is an
+expression of SQL on "kind", "words" and a row of the table "state" of pallax
+sql as it is after the event's packet: time, packet, fields and their ages.
+
 A record that cannot be read ends the events of its recording. Events from a
 pipe are written when they happen.
 
 Exit status:
   0   success, or the reader of the output has gone
   1   failure: cannot read a recording or template, or write the output
-  2   wrong usage
+  2   wrong usage, or a wrong condition
   70  ended by a fatal record)";
 
 constexpr const char* kFieldsFooter = R"(Examples:
@@ -185,6 +190,8 @@ void addEvents(CLI::App& app, EventsOptions& options) {
     addTechnology(app, "--technology", options.technology,
                   "The technology of the recordings (default: from their link type)");
     app.add_flag("--json", options.json, "JSON, one object per line");
+    app.add_option("--where", options.where, "List only the events for which this holds")
+        ->type_name("CONDITION");
     app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
         ->required()
         ->type_name("");

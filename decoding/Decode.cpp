@@ -5,6 +5,7 @@
 #include "decoding/DecodeProgress.h"
 #include "decoding/DroppedNotices.h"
 #include "decoding/FieldSelection.h"
+#include "decoding/InstalledKnowledge.h"
 #include "decoding/OrderedWorkers.h"
 #include "decoding/Preconditions.h"
 #include "decoding/RequiredTemplates.h"
@@ -57,10 +58,11 @@ ExitStatus withCommand(const DecodeOptions& options, DecodeProgress& progress, c
     const auto open = [&report](const std::string& path) {
         return Recording::openInput({path, {}, report});
     };
-    DecodeCommand command(
-        options,
-        {resources, bundle, notices, technologiesWithSnapshots(SnapshotDisplays::OneByOne)}, open,
-        report, progress.isShown() ? &progress : nullptr, localZone);
+    DecodeCommand command(options,
+                          {resources, bundle, notices,
+                           technologiesWithSnapshots(SnapshotDisplays::OneByOne),
+                           installedKnowledge()},
+                          open, report, progress.isShown() ? &progress : nullptr, localZone);
     return use(command);
 }
 
@@ -132,7 +134,8 @@ public:
                                 {_options.recordings.at(recording), outcome.signal}));
         }
         _status = outcome.status == kExitSuccess ? _status : outcome.status;
-        return !outcome.gaveUp && outcome.status != kExitFatalRecord;
+        return !outcome.gaveUp && outcome.status != kExitFatalRecord &&
+               outcome.status != kExitWrongUsage;
     }
 
 private:

@@ -31,7 +31,7 @@ ExitStatus DecodeCommand::run(Output& output) {
         const ExitStatus result = decodeNext(place, {output, *displays});
         status = result == kExitSuccess ? status : result;
         output.flush(); // the next recording may have to be waited for
-        if (result == kExitFatalRecord) {
+        if (result == kExitFatalRecord || result == kExitWrongUsage) {
             break;
         }
     }
@@ -85,17 +85,49 @@ ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destin
 ExitStatus DecodeCommand::decodeWith(Recording& recording, const RecordedTechnology& technology,
                                      const Destination& destination) {
     DecodeWindow window(_options.chosenWindow());
-    WindowedOutput displays(destination.displays, window, _options.chosenEvery());
+    const auto condition = conditioned(recording, technology, destination.displays);
+    if (!condition) {
+        return condition.error();
+    }
+    DisplayOutput& chosen = *condition != nullptr ? **condition : destination.displays;
+    WindowedOutput displays(chosen, window, _options.chosenEvery());
     RecordingDecoder decoder(_environment, technology.identifier, _options.chosenEvery(), displays);
     if (!decoder.hasGenerator()) {
         return failed(noGeneratorSentence(recording.name(), technology.identifier));
+    }
+    if (*condition != nullptr) {
+        decoder.addSampleSink((*condition)->sink());
     }
     if (const auto span = spanBefore(recording)) {
         if (const auto sentence = window.open(*span, _zone)) {
             return failed(recording.name() + ": " + *sentence);
         }
     }
-    return decodePackets(recording, decoder, window, destination.output);
+    const ExitStatus status = decodePackets(recording, decoder, window, destination.output);
+    if (*condition != nullptr) {
+        for (const std::string& note : (*condition)->notes()) {
+            _report(recording.name() + ": " + note);
+        }
+    }
+    return status;
+}
+
+Result<std::unique_ptr<ConditionedOutput>, ExitStatus>
+DecodeCommand::conditioned(const Recording& recording, const RecordedTechnology& technology,
+                           DisplayOutput& displays) {
+    if (!_options.where) {
+        return std::unique_ptr<ConditionedOutput>();
+    }
+    if (&technology == &kSnapshotTechnology) {
+        return failed(noTimeOfSnapshot(recording.name()).sentence);
+    }
+    auto made = ConditionedOutput::make(
+        displays, {*_options.where, technology, _options.chosenEvery()}, _environment);
+    if (!made) {
+        _report("--where: " + made.error());
+        return ExitStatus(kExitWrongUsage);
+    }
+    return std::move(made).value();
 }
 
 std::optional<TimeSpan> DecodeCommand::spanBefore(const Recording& recording) const {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "console/ExitStatus.h"
+#include "decoding/ConditionedOutput.h"
 #include "decoding/DecodeWindow.h"
 #include "decoding/RecordingDecoder.h"
 #include "host/Recording.h"
@@ -27,12 +28,13 @@ struct DecodeOptions {
     bool strict = false;
     /// How many recordings are decoded at once; if missing, one per core.
     std::optional<unsigned> jobs;
-    DecodeWindow::Texts window = {};      ///< of the displays to write
-    std::optional<TimeText> at = {};      ///< the only display to write, in place of these
-    std::vector<std::string> select = {}; ///< names of fields; if empty, all
-    bool typed = false;                   ///< JSON: numbers as objects
-    bool recordingColumn = false;         ///< CSV
-    bool join = false;                    ///< the recordings are one
+    DecodeWindow::Texts window = {};       ///< of the displays to write
+    std::optional<TimeText> at = {};       ///< the only display to write, in place of these
+    std::vector<std::string> select = {};  ///< names of fields; if empty, all
+    bool typed = false;                    ///< JSON: numbers as objects
+    bool recordingColumn = false;          ///< CSV
+    bool join = false;                     ///< the recordings are one
+    std::optional<std::string> where = {}; ///< condition on the displays to write
 
     DecodeWindow::Texts chosenWindow() const {
         return at ? DecodeWindow::Texts{std::nullopt, at} : window;
@@ -90,6 +92,10 @@ private:
     ExitStatus decode(Recording& recording, const Destination& destination);
     ExitStatus decodeWith(Recording& recording, const RecordedTechnology& technology,
                           const Destination& destination);
+    /// Reports what is wrong with the condition.
+    Result<std::unique_ptr<ConditionedOutput>, ExitStatus>
+    conditioned(const Recording& recording, const RecordedTechnology& technology,
+                DisplayOutput& displays);
     /// The span of a recording whose end matters; nothing if it is not needed or not to be known.
     std::optional<TimeSpan> spanBefore(const Recording& recording) const;
     Recording::OpenResult openWhole(std::size_t place) const;

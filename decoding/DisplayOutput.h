@@ -19,6 +19,7 @@ enum class Every { End, Tick, Packet };
 struct DisplayMoment {
     std::uint64_t number = 0; ///< of the tick or packet, from 1
     Time time;
+    std::uint64_t packet = 0; ///< the latest before it
 };
 
 /// The output of displays, one recording after the other.

@@ -2,8 +2,10 @@
 
 #include "LogGenerator/Technologies/Technologies.h"
 #include "console/Output.h"
+#include "decoding/ConditionedOutput.h"
 #include "decoding/DisplayJson.h"
 #include "decoding/DroppedNotices.h"
+#include "decoding/InstalledKnowledge.h"
 #include "decoding/Preconditions.h"
 #include "decoding/RequiredTemplates.h"
 #include "host/BuildBundle.h"
@@ -68,15 +70,32 @@ public:
                Output& output)
         : _options(options), _zone(zone), _recording(recording), _output(output) {}
 
+    /// Writes only the events for which the condition holds.
+    void setCondition(QueryCondition& condition) { _condition = &condition; }
+
     void writeNew(const Timeline& timeline) {
         const std::uint64_t dropped = timeline.eventsDropped();
         for (_next = std::max(_next, dropped); _next < dropped + timeline.events().size();
              ++_next) {
-            write(timeline.events()[_next - dropped]);
+            const Event& event = timeline.events()[_next - dropped];
+            if (isWanted(event, timeline.latestValues())) {
+                write(event);
+            }
         }
     }
 
 private:
+    /// `values` are those after the event's packet: new events are all of the latest one.
+    bool isWanted(const Event& event, const CurrentValues& values) const {
+        if (_condition == nullptr) {
+            return true;
+        }
+        const auto holds = _condition->holds({{event.time, event.packet}, &event}, values);
+        if (!holds) {
+            throw ConditionFailure(holds.error());
+        }
+        return *holds;
+    }
     void write(const Event& event) {
         std::string& text = _output.text();
         if (_options.json) {
@@ -110,6 +129,7 @@ private:
     const Clock& _zone;
     const std::string& _recording;
     Output& _output;
+    QueryCondition* _condition = nullptr;
     std::uint64_t _next = 0;
 };
 
@@ -121,6 +141,9 @@ ExitStatus EventsCommand::run(Output& output) {
         const ExitStatus result = tell(path, output);
         status = result == kExitSuccess ? status : result;
         output.flush(); // the next recording may have to be waited for
+        if (result == kExitWrongUsage) {
+            break;
+        }
     }
     return status;
 }
@@ -158,8 +181,23 @@ ExitStatus EventsCommand::tellEvents(Recording& recording, const RecordedTechnol
     Timeline timeline(journal, {technology, _environment.resources, _environment.bundle,
                                 _environment.technologies});
     index = &timeline;
+    std::unique_ptr<QueryCondition> condition;
+    if (_options.where) {
+        auto compiled =
+            QueryCondition::compile(*_options.where, timeline.fields(),
+                                    QueryCondition::About::Event, _environment.knowledge);
+        if (!compiled) {
+            _report("--where: " + compiled.error());
+            return kExitWrongUsage;
+        }
+        condition = std::move(compiled).value();
+        lines.setCondition(*condition);
+    }
     (void)timeline.index();
     lines.writeNew(timeline);
+    for (const std::string& note : condition ? notesOn(*condition) : std::vector<std::string>()) {
+        _report(recording.name() + ": " + note);
+    }
     if (timeline.hasEnded()) {
         const Event& fatal = timeline.events().back();
         _report(formatText("%@: packet %llu cannot be read; the events end there.",
@@ -182,7 +220,8 @@ ExitStatus runEvents(const EventsOptions& options) {
     const BuildBundle bundle;
     const WallClock zone;
     DroppedNotices notices;
-    const DecoderEnvironment environment{resources, bundle, notices, technologies()};
+    const DecoderEnvironment environment{resources, bundle, notices, technologies(),
+                                         installedKnowledge()};
     const auto report = [](std::string_view sentence) { complain(sentence); };
     const auto open = [&report](const std::string& path) {
         return Recording::openInput({path, {}, report});

@@ -18,6 +18,7 @@ struct EventsOptions {
     /// The technology of every recording, overriding its link type.
     const RecordedTechnology* technology = nullptr;
     bool json = false;
+    std::optional<std::string> where = {}; ///< condition on the events to write
 };
 
 /// Writes a line for each event of the recordings, in the order of the command line: local time,

@@ -34,7 +34,7 @@ std::optional<std::string> RecordingDecoder::add(const RecordedPacket& packet) {
         (void)generate(packet.time);
     }
     if (_every == Every::Packet) {
-        _output.show({_packets, packet.time}, _driver.display());
+        _output.show({_packets, packet.time, _packets}, _driver.display());
     }
     return std::nullopt;
 }
@@ -44,7 +44,7 @@ void RecordingDecoder::finish() {
         tick(_grid.next());
     }
     if (_every == Every::End) {
-        _output.show({_packets, _lastPacket.value_or(Time())}, _driver.display());
+        _output.show({_packets, _lastPacket.value_or(Time()), _packets}, _driver.display());
     }
 }
 
@@ -54,7 +54,7 @@ void RecordingDecoder::tick(const TickGrid::Tick& tick) {
     }
     const PropertyList display = generate(tick.time);
     if (_every == Every::Tick) {
-        _output.show({tick.number, tick.time}, display);
+        _output.show({tick.number, tick.time, _packets}, display);
     }
 }
 

@@ -5,6 +5,7 @@
 #include "monitor/DisplayDriver.h"
 #include "monitor/PacketClock.h"
 #include "monitor/TickGrid.h"
+#include "query/Functions.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -22,6 +23,7 @@ struct DecoderEnvironment {
     StandardOutput& standardOutput; ///< for the generators' notices, which are not part of a
                                     ///< display
     std::span<const Technology> technologies;
+    QueryKnowledge knowledge = {}; ///< for the functions of conditions
 };
 
 /// Decodes the packets of one recording by driving its generator directly. Its display ticks are on

@@ -161,6 +161,10 @@ Result<std::optional<std::vector<QueryValue>>, QueryError> Query::next() {
     return Row(std::move(row));
 }
 
+void Query::restart() {
+    sqlite3_reset(_statement.get());
+}
+
 void Database::Close::operator()(sqlite3* connection) const {
     sqlite3_close_v2(connection);
 }

@@ -40,6 +40,8 @@ public:
     const std::vector<std::string>& columns() const { return _columns; }
     /// The next row; nothing after the last.
     Result<std::optional<std::vector<QueryValue>>, QueryError> next();
+    /// Runs it again from the first row.
+    void restart();
 
 private:
     friend class Database;

@@ -201,7 +201,7 @@ private:
     const QualityProfile& profile(std::string_view name) {
         auto found = _profiles.find(name);
         if (found == _profiles.end()) {
-            auto profile = _knowledge.profile(name);
+            auto profile = _knowledge.profile ? _knowledge.profile(name) : std::nullopt;
             if (!profile) {
                 throw std::invalid_argument(formatText("there is no profile \"%@\"", {name}));
             }
@@ -224,7 +224,7 @@ void addFunctions(Database& database, QueryKnowledge knowledge, const FieldTable
     database.addFunction("cell_site", 2, cellSite);
     database.addFunction("time_text", 1, timeText);
     database.addFunction("operator", 2, [names = knowledge.names](Arguments arguments) {
-        return operatorName(arguments, names());
+        return operatorName(arguments, names ? names() : nullptr);
     });
     const auto judge = std::make_shared<Judge>(std::move(knowledge), fields);
     const auto quality = [judge](Arguments arguments) { return judge->quality(arguments); };

@@ -15,10 +15,10 @@ class NetworkNames;
 
 /// What the functions know beside tables of their own.
 struct QueryKnowledge {
-    /// The names of networks; null without any. Called at the first use.
-    std::function<const NetworkNames*()> names;
-    /// The profile of that name, or nothing.
-    std::function<std::optional<QualityProfile>(std::string_view name)> profile;
+    /// The names of networks; null without any. Called at the first use. Without it there are none.
+    std::function<const NetworkNames*()> names = {};
+    /// The profile of that name, or nothing. Without it there are none.
+    std::function<std::optional<QualityProfile>(std::string_view name)> profile = {};
 };
 
 /// Adds the functions that know what numbers mean. They return NULL where there is no answer, and

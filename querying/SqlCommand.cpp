@@ -5,19 +5,17 @@
 #include "console/Progress.h"
 #include "console/TerminalLine.h"
 #include "decoding/DroppedNotices.h"
+#include "decoding/InstalledKnowledge.h"
 #include "decoding/RequiredTemplates.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
 #include "host/Files.h"
-#include "host/KnowledgeFiles.h"
-#include "host/UserFolders.h"
 #include "host/WallClock.h"
-#include "knowledge/Networks.h"
 #include "query/Functions.h"
+#include "query/QueryErrorText.h"
 #include "query/TimelineTables.h"
 #include "querying/RecordedTimeline.h"
 #include "text/Format.h"
-#include "text/Suggestion.h"
 
 #include <algorithm>
 #include <unistd.h>
@@ -59,25 +57,6 @@ Result<Question, Refusal> questionOf(const SqlOptions& options) {
                        kExitWrongUsage};
     }
     return question;
-}
-
-/// Names of networks and profiles of this machine.
-QueryKnowledge knowledge() {
-    auto names = std::make_shared<std::optional<NetworkNames>>();
-    return {[names]() -> const NetworkNames* {
-                if (!*names) {
-                    InstalledNames installed = readInstalledNames(dataFolders());
-                    for (const std::string& complaint : installed.complaints) {
-                        complain(complaint);
-                    }
-                    *names = std::move(installed.names);
-                }
-                return &**names;
-            },
-            [](std::string_view name) -> std::optional<QualityProfile> {
-                auto profile = loadProfile(name, profileFolder());
-                return profile ? std::optional(std::move(profile).value()) : std::nullopt;
-            }};
 }
 
 /// Shows on a terminal what a user waits for.
@@ -129,23 +108,6 @@ ExitStatus writeRows(Query& query, RowFormat format, Waiting& waiting) {
 
 } // namespace
 
-std::string queryErrorText(const QueryError& error, const std::string& query,
-                           const std::vector<std::string>& names) {
-    std::string text = error.sentence;
-    const std::size_t colon = text.rfind(": ");
-    if (colon != std::string::npos && text.starts_with("no such")) {
-        const std::string name = text.substr(colon + 2);
-        text += suggestion(name.substr(name.rfind('.') + 1), names);
-    }
-    if (error.place && *error.place <= query.size()) {
-        const std::string before = query.substr(0, *error.place);
-        const auto line = std::count(before.begin(), before.end(), '\n') + 1;
-        const std::size_t column = before.size() - (before.rfind('\n') + 1) + 1;
-        text += formatText(" (line %lld, column %zu of the query)", {line, column});
-    }
-    return text;
-}
-
 ExitStatus runSql(const SqlOptions& options) {
     const auto question = questionOf(options);
     if (!question) {
@@ -168,7 +130,7 @@ ExitStatus runSql(const SqlOptions& options) {
     }
     Database database;
     addTimelineTables(database, (*recorded)->timeline());
-    addFunctions(database, knowledge(), &(*recorded)->timeline().fields());
+    addFunctions(database, installedKnowledge(), &(*recorded)->timeline().fields());
     auto query = database.prepare(question->query);
     if (!query) {
         complain(queryErrorText(query.error(), question->query, database.names()));

@@ -24,9 +24,4 @@ struct SqlOptions {
 /// wrong usage. TemplateFailure, OutputClosed and OutputFailure leave.
 ExitStatus runSql(const SqlOptions& options);
 
-/// "no such column: rspr. Did you mean "rsrp"? (line 1, column 8 of the query)"; `names` are those
-/// that can be meant.
-std::string queryErrorText(const QueryError& error, const std::string& query,
-                           const std::vector<std::string>& names);
-
 } // namespace pallax

@@ -10,6 +10,7 @@ public:
     explicit Indexer(Timeline& timeline, std::chrono::nanoseconds pingPong);
 
     bool run(const MayContinue& mayContinue);
+    const CurrentValues& values() const { return _values; }
 
 private:
     void take(const JournalPacket& packet);

@@ -21,6 +21,10 @@ bool Timeline::index(const MayContinue& mayContinue) {
     return _indexer->run(mayContinue);
 }
 
+const CurrentValues& Timeline::latestValues() const {
+    return _indexer->values();
+}
+
 std::uint64_t Timeline::firstInstant() const {
     const auto& keyFrames = _keyFrames.all();
     return keyFrames.empty() ? _packets : keyFrames.front().packet;

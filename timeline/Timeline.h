@@ -81,6 +81,8 @@ public:
     /// Sentences about what was left out or went wrong; empty if all is well.
     std::vector<std::string> notes() const;
 
+    /// The current values at the latest instant.
+    const CurrentValues& latestValues() const;
     /// The current values at an instant. The instant must lie between the earliest and the latest.
     CurrentValues valuesAt(std::uint64_t instant);
     /// The display at an instant as `decode` shows it; null before the first packet. Nothing else

@@ -237,6 +237,18 @@ TEST_F(EndToEndStatus, OfSnapshot) {
     ends({{"sql", path, "select 1"}, 1, sentence});
 }
 
+TEST_F(EndToEndStatus, OfConditions) {
+    const std::string sentence = "pallax: --where: no such column: tme. Did you mean \"time\"? "
+                                 "(line 1, column 1 of the condition)\n";
+    ends({{"decode", "--where", "tme > 1", sample, sample}, 2, sentence});
+    ends({{"decode", "--jobs", "1", "--where", "tme > 1", sample, sample}, 2, sentence});
+    ends({{"events", "--where", "tme > 1", sample, sample}, 2, sentence});
+    const std::string profile = "quality('x', packet, 'unknown') is null";
+    const std::string failure = "pallax: --where: there is no profile \"unknown\"\n";
+    ends({{"decode", "--where", profile, sample}, 1, failure});
+    ends({{"decode", "--where", "quality('x', time, 'android') is null", sample}, 0, ""});
+}
+
 TEST_F(EndToEndStatus, OfSql) {
     ends({{"sql", sample, "select count(*) from packet"}, 0, ""});
     ends({{"sql", missing, "select 1"}, 1, isMissing});

@@ -53,5 +53,14 @@ TEST(Options, InfoTakesFiles) {
     EXPECT_TRUE(info.json);
 }
 
+TEST(PartOptions, WhereTakesACondition) {
+    EXPECT_EQ(parsed<DecodeOptions>({"decode", "--where", "a < -1", "a.pcap"}).where, "a < -1");
+    EXPECT_EQ(parsed<EventsOptions>({"events", "--where", "kind = 'gap'", "a.pcap"}).where,
+              "kind = 'gap'");
+    EXPECT_EQ(parsed<DecodeOptions>({"decode", "a.pcap"}).where, std::nullopt);
+    EXPECT_EQ(ended({"decode", "--where"}).text,
+              "pallax: --where: 1 required CONDITION missing (see pallax decode --help)\n");
+}
+
 } // namespace
 } // namespace pallax

@@ -70,7 +70,7 @@ const std::vector<Layer>& layers() {
         {"console", {"text", "platform", "host"}},
         {"decoding",
          {"text", "plist", "platform", "packets", records, generators, "LogGenerator/Technologies",
-          "app/tree", "monitor", "host", "fields", "timeline", "console"}},
+          "app/tree", "monitor", "host", "knowledge", "fields", "timeline", "query", "console"}},
         {"explaining",
          {"text", "plist", "platform", records, "LogGenerator/Technologies", "knowledge", "host",
           "fields", "console", "decoding"}},

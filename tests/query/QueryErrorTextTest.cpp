@@ -1,4 +1,4 @@
-#include "querying/SqlCommand.h"
+#include "query/QueryErrorText.h"
 
 #include <gtest/gtest.h>
 
@@ -15,6 +15,8 @@ TEST(QueryErrorText, SuggestsANameAndTellsThePlace) {
               "no such column: s.measured_rspr. Did you mean \"measured_rsrp\"?");
     EXPECT_EQ(queryErrorText({"no such table: stat", {}}, "", kNames),
               "no such table: stat. Did you mean \"state\"?");
+    EXPECT_EQ(queryErrorText({"no such column: rsrp", {}}, "", kNames),
+              "no such column: rsrp. Did you mean \"measured_rsrp\"?");
     EXPECT_EQ(queryErrorText({"no such column: quite_another", {}}, "", kNames),
               "no such column: quite_another");
 }
