@@ -1,5 +1,6 @@
 #include "cli/InspectOptions.h"
 
+#include "cli/Amounts.h"
 #include "cli/OptionParts.h"
 #include "decoding/InfoCommand.h"
 #include "decoding/SnapshotCommand.h"
@@ -42,6 +43,12 @@ constexpr const char* kSqlFooter = R"(Examples:
   pallax sql drive.pcap 'select physical_cell_id, avg(measured_rsrp)
       from serving_cell_measurements group by 1'
   pallax sql drive.pcap --format csv --file worst-cells.sql > worst.csv
+  pallax sql drive.pcap
+
+Without a query, those that you type are answered, or those on standard input;
+each ends with ";". On a terminal, Tab completes names, Ctrl-C stops a query or
+clears the line, .help lists the commands, and Ctrl-D ends. Earlier queries are
+kept in $XDG_STATE_HOME/pallax/sql-history (by default ~/.local/state).
 
 The query is one statement of SQL, as SQLite has it, that only reads. "time" is
 UTC in microseconds. The tables:
@@ -70,7 +77,7 @@ NULL where the display has a text instead ("Not Present").
 
 Exit status:
   0   success, or the reader of the output has gone
-  1   failure: cannot read a whole recording or a template, or write the output
+  1   failure: cannot read a recording or write the output, or a query failed
   2   wrong usage, or a wrong query)";
 
 constexpr const char* kSnapshotFooter = R"(Examples:
@@ -112,8 +119,18 @@ void addSql(CLI::App& app, SqlOptions& options) {
         {{"table", RowFormat::Table}, {"csv", RowFormat::Csv}, {"json", RowFormat::Json}},
         "A table, CSV, or JSON, one object per row (default: table)");
     app.add_option("--file", options.file, "Read the query from this file")->type_name("FILE");
-    app.add_option("RECORDING", options.words,
-                   "Recordings (pcap or pcapng); then, unless it is in a file, the query")
+    app.add_option_function<std::string>(
+           "--timeout",
+           [&options](const std::string& text) {
+               const auto seconds = parseSeconds(text);
+               if (!seconds) {
+                   throw CLI::ValidationError("--timeout", seconds.error());
+               }
+               options.timeout = *seconds;
+           },
+           "Stop a query that takes longer (default: never)")
+        ->type_name("SECONDS");
+    app.add_option("RECORDING", options.words, "Recordings (pcap or pcapng); then the query")
         ->required()
         ->type_name("");
     app.footer(kSqlFooter);

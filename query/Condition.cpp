@@ -181,7 +181,7 @@ QueryCondition::compile(std::string_view text, const FieldTable& fields, About a
         auto table = std::make_unique<Row>(fields, about, late);
         parts->row = table.get();
         parts->database.add("main", "state", std::move(table));
-        addFunctions(parts->database, knowledge);
+        addFunctions(parts->database, knowledge, &fields);
         const auto columnOf = [&](std::string_view name) {
             return parts->row->columnOf(name, technology);
         };

@@ -225,6 +225,9 @@ void Database::addFunction(const char* name, int arguments, Function function) {
         throw std::runtime_error(sqlite3_errmsg(_connection.get()));
     }
     _names.emplace_back(name);
+    if (std::find(_functionNames.begin(), _functionNames.end(), name) == _functionNames.end()) {
+        _functionNames.emplace_back(name);
+    }
 }
 
 void Database::setMayContinue(std::function<bool()> mayContinue) {

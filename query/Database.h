@@ -81,6 +81,8 @@ public:
     };
     /// All tables, in the order in which they were added.
     std::vector<Table> tables() const;
+    /// The names of the functions that were added.
+    const std::vector<std::string>& functions() const { return _functionNames; }
     /// The names of all tables, columns and functions, for suggestions.
     const std::vector<std::string>& names() const { return _names; }
     /// Asked every few thousand steps of a query; false stops it.
@@ -106,6 +108,7 @@ private:
     std::vector<std::unique_ptr<Function>> _functions;
     std::vector<std::string> _names;
     std::unique_ptr<Authority> _authority;
+    std::vector<std::string> _functionNames;
 
     std::unique_ptr<sqlite3, Close> _connection;
     std::vector<std::string> _schemas;

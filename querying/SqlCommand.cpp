@@ -7,17 +7,23 @@
 #include "decoding/DroppedNotices.h"
 #include "decoding/InstalledKnowledge.h"
 #include "decoding/RequiredTemplates.h"
+#include "host/BoundedJournal.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
 #include "host/Files.h"
+#include "host/MonotonicClock.h"
 #include "host/WallClock.h"
 #include "query/Functions.h"
-#include "query/QueryErrorText.h"
 #include "query/TimelineTables.h"
+#include "querying/EditedLines.h"
+#include "querying/QueryRun.h"
 #include "querying/RecordedTimeline.h"
+#include "querying/SqlShell.h"
 #include "text/Format.h"
 
 #include <algorithm>
+#include <filesystem>
+#include <memory>
 #include <unistd.h>
 #include <utility>
 
@@ -25,11 +31,9 @@ namespace pallax {
 
 namespace {
 
-constexpr std::size_t kLongestQuery = std::size_t{1} << 20U;
-
 struct Question {
     std::vector<std::string> recordings;
-    std::string query;
+    std::optional<std::string> query; ///< nothing: those that a shell reads
 };
 
 /// Why there is no question.
@@ -38,22 +42,36 @@ struct Refusal {
     ExitStatus status;
 };
 
+/// A query is hardly ever the name of a file that is there.
+bool isRecording(const std::string& word) {
+    std::error_code ignored;
+    return word == "-" || std::filesystem::exists(word, ignored);
+}
+
 Result<Question, Refusal> questionOf(const SqlOptions& options) {
     Question question{options.words, {}};
     if (options.file) {
-        const auto content = readRegularFile(*options.file, kLongestQuery);
+        const auto content = readRegularFile(*options.file, kLongestStatement);
         if (!content) {
             return Refusal{
                 formatText("%@ cannot be read: %@.", {*options.file, content.error().reason}),
                 kExitFailure};
         }
-        question.query.assign(content->begin(), content->end());
-    } else if (!question.recordings.empty()) {
+        question.query.emplace(content->begin(), content->end());
+    } else if (question.recordings.size() > 1 && !isRecording(question.recordings.back())) {
         question.query = std::move(question.recordings.back());
         question.recordings.pop_back();
     }
-    if (question.recordings.empty()) {
+    const auto& recordings = question.recordings;
+    const bool isQuery = recordings.size() == 1 && !isRecording(recordings.front()) &&
+                         recordings.front().find(' ') != std::string::npos;
+    if (recordings.empty() || (isQuery && !question.query)) {
         return Refusal{"sql takes recordings and then a query (see pallax sql --help)",
+                       kExitWrongUsage};
+    }
+    if (!question.query &&
+        std::find(recordings.begin(), recordings.end(), "-") != recordings.end()) {
+        return Refusal{"a recording on standard input needs a query after it, or --file",
                        kExitWrongUsage};
     }
     return question;
@@ -86,24 +104,23 @@ private:
     ProgressPace _pace{_clock};
 };
 
-ExitStatus writeRows(Query& query, RowFormat format, Waiting& waiting) {
-    Output output(waiting.output());
-    RowWriter writer(format, query.columns(), output);
-    while (true) {
-        auto row = query.next();
-        if (!row) {
-            writer.finish();
-            waiting.end();
-            complain(row.error().sentence);
-            return kExitFailure;
-        }
-        std::optional<std::vector<QueryValue>> values = std::move(row).value();
-        if (!values) {
-            writer.finish();
-            return kExitSuccess;
-        }
-        writer.write(*std::move(values));
+/// Where the queries of a shell come from, and what it does after a wrong one.
+ExitStatus runShell(QueryRun& run, RowFormat format) {
+    if (::isatty(STDIN_FILENO) == 0) {
+        PlainLines lines(*stdin, false);
+        return SqlShell(run, lines, format, SqlShell::Errors::End).run();
     }
+    std::unique_ptr<LineReader> lines;
+    if (::isatty(STDOUT_FILENO) != 0) {
+        lines =
+            editedLines(QueryHistory(BoundedJournal::stateFolder()), [&run](std::string_view text) {
+                return completionOf(run.database(), text);
+            });
+    }
+    if (!lines) {
+        lines = std::make_unique<PlainLines>(*stdin, true);
+    }
+    return SqlShell(run, *lines, format, SqlShell::Errors::Go).run();
 }
 
 } // namespace
@@ -131,17 +148,16 @@ ExitStatus runSql(const SqlOptions& options) {
     Database database;
     addTimelineTables(database, (*recorded)->timeline());
     addFunctions(database, installedKnowledge(), &(*recorded)->timeline().fields());
-    auto query = database.prepare(question->query);
-    if (!query) {
-        complain(queryErrorText(query.error(), question->query, database.names()));
-        return kExitWrongUsage;
-    }
-    auto running = std::move(query).value();
-    database.setMayContinue([&waiting] {
-        waiting.querying();
-        return true;
-    });
-    const ExitStatus status = writeRows(running, options.format, waiting);
+    Output output(waiting.output());
+    const MonotonicClock clock;
+    QueryRun run(database, {options.timeout, !question->query},
+                 {output, clock, [&waiting] { waiting.querying(); },
+                  [&waiting](std::string_view sentence) {
+                      waiting.end();
+                      complain(sentence);
+                  }});
+    const ExitStatus status =
+        question->query ? run.run(*question->query, options.format) : runShell(run, options.format);
     waiting.end();
     const std::vector<std::string> notes = (*recorded)->notes();
     for (const std::string& note : notes) {

@@ -3,6 +3,7 @@
 #include "console/ExitStatus.h"
 #include "querying/RowWriter.h"
 
+#include <chrono>
 #include <optional>
 #include <string>
 #include <vector>
@@ -13,15 +14,17 @@ struct RecordedTechnology;
 
 /// `pallax sql`: a question about a recording.
 struct SqlOptions {
-    /// Recordings and, unless it is in a file, the query.
+    /// Recordings and then, unless it is in a file or a shell reads queries, the query.
     std::vector<std::string> words;
     std::optional<std::string> file; ///< with the query
     RowFormat format = RowFormat::Table;
-    const RecordedTechnology* technology = nullptr; ///< overrides the link type
+    std::optional<std::chrono::nanoseconds> timeout = {}; ///< of each query
+    const RecordedTechnology* technology = nullptr;       ///< overrides the link type
 };
 
-/// Opens the recordings, runs the query and writes its rows to standard output. A wrong query is
-/// wrong usage. TemplateFailure, OutputClosed and OutputFailure leave.
+/// Opens the recordings, runs the query and writes its rows to standard output; without a query,
+/// those that a user types or that are on standard input. A wrong query is wrong usage.
+/// TemplateFailure, OutputClosed and OutputFailure leave.
 ExitStatus runSql(const SqlOptions& options);
 
 } // namespace pallax

@@ -259,7 +259,18 @@ TEST_F(EndToEndStatus, OfSql) {
           "/dev/full"});
     ends({{"sql", sample},
           2,
+          "pallax: sql takes recordings and then a query, or queries on standard input (see pallax "
+          "sql --help)\n"});
+    ends({{"sql", "select 1"},
+          2,
           "pallax: sql takes recordings and then a query (see pallax sql --help)\n"});
+    ends({{"sql", sample, "-"},
+          2,
+          "pallax: a recording on standard input needs a query after it, or --file\n"});
+    ends({{"sql", "--timeout", "0", sample, "select 1"},
+          2,
+          "pallax: --timeout: \"0\" is out of range, which is above 0 and up to 1000000000 (see "
+          "pallax sql --help)\n"});
     ends({{"sql", sample, "select tme from packet"},
           2,
           "pallax: no such column: tme. Did you mean \"time\"? (line 1, column 8 of the query)\n"});

@@ -1,0 +1,25 @@
+#pragma once
+
+#include <csignal>
+
+namespace pallax {
+
+/// Takes Ctrl-C (SIGINT) for as long as it lives, so that it ends what runs and not the program.
+/// One at a time.
+class Interrupt {
+public:
+    enum class Watched { No, Yes };
+
+    explicit Interrupt(Watched watched);
+    ~Interrupt();
+    Interrupt(const Interrupt&) = delete;
+    Interrupt& operator=(const Interrupt&) = delete;
+
+    bool hasCome() const;
+
+private:
+    bool _isWatched;
+    struct sigaction _before {};
+};
+
+} // namespace pallax
