@@ -1,14 +1,7 @@
 #include "decoding/DecodeCommand.h"
 
-#include "decoding/DroppedNotices.h"
-#include "decoding/RequiredTemplates.h"
-#include "tests/decoding/ScriptedRadio.h"
-#include "tests/doubles/FakeBundle.h"
+#include "tests/decoding/CommandFixture.h"
 #include "tests/doubles/FakeResources.h"
-
-#include <gtest/gtest.h>
-
-#include <map>
 
 namespace pallax {
 namespace {
@@ -19,9 +12,8 @@ using doubles::ScriptedRecording;
 using std::chrono::hours;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
-using Packets = std::vector<ScriptedRecording::Packet>;
 
-class DecodeCommandTest : public testing::Test {
+class DecodeCommandTest : public CommandFixture {
 protected:
     DecodeCommandTest() { ScriptedGenerator::generations.clear(); }
 
@@ -29,36 +21,17 @@ protected:
              const RecordedTechnology* technology = &doubles::kScriptedLte,
              std::optional<RecordingError> atEnd = std::nullopt) {
         options.recordings.push_back(name);
-        recordings[name] = std::make_unique<ScriptedRecording>(name, std::move(packets), technology,
-                                                               std::move(atEnd));
+        script(name, std::move(packets), technology, std::move(atEnd));
     }
-
     ExitStatus run() {
-        const auto open = [this](const std::string& path) -> Recording::OpenResult {
-            const auto found = recordings.find(path);
-            if (found == recordings.end()) {
-                return RecordingError{RecordingError::Kind::CannotOpen, path + " is not there"};
-            }
-            return std::move(found->second);
-        };
-        const auto report = [this](std::string_view sentence) { reports.emplace_back(sentence); };
-        Output output([this](std::string_view block) {
-            written += block;
-            blocks.emplace_back(block);
-        });
+        Output output(write());
         DecodeCommand command(options, {resources, bundle, notices, doubles::kScriptedTechnologies},
-                              open, report);
+                              open(), report());
         return command.run(output);
     }
 
     DecodeOptions options;
-    std::map<std::string, std::unique_ptr<Recording>> recordings;
-    std::string written;
-    std::vector<std::string> blocks; // the same in the original blocks
-    std::vector<std::string> reports;
     doubles::FakeResources resources;
-    doubles::FakeBundle bundle;
-    DroppedNotices notices;
 };
 
 TEST_F(DecodeCommandTest, EndGivesTheDisplayAfterTheLastPacket) {
@@ -233,7 +206,7 @@ TEST_F(DecodeCommandTest, AMissingRecordingDoesNotKeepTheOthersFromBeingDecoded)
     add("b.pcap", {{milliseconds(0), "B=2"}});
     EXPECT_EQ(run(), kExitFailure);
     EXPECT_EQ(written, "{\"Cell\":{\"B\":\"2\"}}\n");
-    EXPECT_EQ(reports, std::vector<std::string>{"missing.pcap is not there"});
+    EXPECT_EQ(reports, std::vector<std::string>{"missing.pcap is not there."});
 }
 
 TEST_F(DecodeCommandTest, AForeignLinkTypeNeedsTheTechnologyOption) {
@@ -276,8 +249,9 @@ TEST_F(DecodeCommandTest, WhatARecordingGivesThatIsWaitedForIsWrittenAtOnceAndAF
     options.every = Every::Packet;
     const Packets packets{{milliseconds(0), "A=1"}, {milliseconds(1), "A=2"}};
     options.recordings.emplace_back("file.pcap");
-    recordings["file.pcap"] =
-        std::make_unique<ScriptedFile>(ScriptedRecording("file.pcap", packets));
+    opens["file.pcap"] = [&packets] {
+        return std::make_unique<ScriptedFile>(ScriptedRecording("file.pcap", packets));
+    };
     add("pipe", packets);
     EXPECT_EQ(run(), kExitSuccess);
     const std::string first =

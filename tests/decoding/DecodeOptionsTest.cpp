@@ -1,34 +1,24 @@
-#include "decoding/DecodeCommand.h"
-#include "decoding/DroppedNotices.h"
 #include "decoding/FieldSelection.h"
-#include "tests/decoding/ScriptedRadio.h"
-#include "tests/doubles/FakeBundle.h"
+#include "tests/decoding/CommandFixture.h"
 #include "tests/doubles/FakeResources.h"
 #include "tests/doubles/Property.h"
 
-#include <gtest/gtest.h>
-
 #include <algorithm>
-#include <map>
 
 namespace pallax {
 namespace {
 
-using doubles::kFirstPacket; // 2023-11-14T22:13:20Z
-using doubles::ScriptedGenerator;
-using doubles::ScriptedRecording;
 using std::chrono::milliseconds;
-using Packets = std::vector<ScriptedRecording::Packet>;
 
 constexpr std::chrono::seconds kEast = std::chrono::hours(1);
 
 /// The options of decode that choose a part of what it writes.
-class DecodeOptionsTest : public testing::Test {
+class DecodeOptionsTest : public CommandFixture {
 protected:
     void add(const std::string& name, Packets packets,
              const RecordedTechnology* technology = &doubles::kScriptedLte) {
         options.recordings.push_back(name);
-        recordings[name] = {std::move(packets), technology};
+        script(name, std::move(packets), technology);
     }
     /// Five packets, a second apart.
     static Packets fivePackets() {
@@ -42,20 +32,9 @@ protected:
         return TimeText::parse(text).value();
     }
     ExitStatus run() {
-        written.clear();
-        reports.clear();
-        const auto open = [this](const std::string& path) -> Recording::OpenResult {
-            const auto found = recordings.find(path);
-            if (found == recordings.end()) {
-                return RecordingError{RecordingError::Kind::CannotOpen, path + " is not there."};
-            }
-            return std::unique_ptr<Recording>(std::make_unique<ScriptedRecording>(
-                path, found->second.first, found->second.second));
-        };
-        const auto report = [this](std::string_view sentence) { reports.emplace_back(sentence); };
-        Output output([this](std::string_view block) { written += block; });
+        Output output(write());
         DecodeCommand command(options, {resources, bundle, notices, doubles::kScriptedTechnologies},
-                              open, report, nullptr, [](Time) { return kEast; });
+                              open(), report(), nullptr, [](Time) { return kEast; });
         return command.run(output);
     }
     /// The values of A in the written displays.
@@ -69,12 +48,7 @@ protected:
     }
 
     DecodeOptions options;
-    std::map<std::string, std::pair<Packets, const RecordedTechnology*>> recordings;
-    std::string written;
-    std::vector<std::string> reports;
     doubles::FakeResources resources;
-    doubles::FakeBundle bundle;
-    DroppedNotices notices;
 };
 
 TEST_F(DecodeOptionsTest, DisplaysOfAWindowAreWritten) {

@@ -1,16 +1,9 @@
 #include "decoding/EventsCommand.h"
 
 #include "LogGenerator/Technologies/Technologies.h"
-#include "decoding/DroppedNotices.h"
-#include "decoding/RequiredTemplates.h"
-#include "tests/decoding/ScriptedRadio.h"
-#include "tests/doubles/FakeBundle.h"
+#include "tests/decoding/CommandFixture.h"
 #include "tests/doubles/ManualClock.h"
 #include "tests/doubles/RecordBuilder.h"
-
-#include <gtest/gtest.h>
-
-#include <map>
 
 namespace pallax {
 namespace {
@@ -18,52 +11,28 @@ namespace {
 using doubles::Record;
 using doubles::ScriptedRecording;
 using std::chrono::seconds;
-using Packets = std::vector<ScriptedRecording::Packet>;
-
-std::string textOf(const ByteBuffer& bytes) {
-    return {bytes.begin(), bytes.end()};
-}
 
 /// Another serving cell, so many seconds after the first packet.
 ScriptedRecording::Packet cell(int second, std::uint16_t pci) {
     return {seconds(second), textOf(Record(0xB0C2).padTo(14).u16(pci).u16(1850).padTo(38).bytes())};
 }
 
-class EventsCommandTest : public testing::Test {
+class EventsCommandTest : public CommandFixture {
 protected:
     void add(const std::string& name, Packets packets, const char* technology = "lte",
              std::optional<RecordingError> atEnd = std::nullopt) {
         options.recordings.push_back(name);
-        recordings[name] = std::make_unique<ScriptedRecording>(
-            name, std::move(packets), technologyOfCommandName(technology), std::move(atEnd));
+        script(name, std::move(packets), technologyOfCommandName(technology), std::move(atEnd));
     }
-
     ExitStatus run() {
-        const auto open = [this](const std::string& path) -> Recording::OpenResult {
-            const auto found = recordings.find(path);
-            if (found == recordings.end()) {
-                return RecordingError{RecordingError::Kind::CannotOpen, path + " is not there"};
-            }
-            return std::move(found->second);
-        };
-        const auto report = [this](std::string_view sentence) { reports.emplace_back(sentence); };
-        Output output([this](std::string_view block) {
-            written += block;
-            blocks.emplace_back(block);
-        });
-        return EventsCommand(options, {resources, bundle, notices, technologies()}, open, report,
-                             zone)
+        Output output(write());
+        return EventsCommand(options, {resources, bundle, notices, technologies()}, open(),
+                             report(), zone)
             .run(output);
     }
 
     EventsOptions options;
-    std::map<std::string, std::unique_ptr<Recording>> recordings;
-    std::string written;
-    std::vector<std::string> blocks;
-    std::vector<std::string> reports;
     DirectoryResources resources{PALLAX_SOURCE_DIR "/resources"};
-    doubles::FakeBundle bundle;
-    DroppedNotices notices;
     doubles::ManualClock zone;
 };
 
@@ -99,7 +68,7 @@ TEST_F(EventsCommandTest, OfSeveralRecordingsEachLineNamesItsOwnAndOneThatFailsS
               "a.pcap: 2023-11-14 22:15:00.000  gap               no packets for 100.0 s\n"
               "a.pcap: 2023-11-14 22:15:00.000  cell-change       serving cell 1 → 2\n"
               "b.pcap: 2023-11-14 22:13:40.000  cell-change       serving cell 3 → 4 after 20 s\n");
-    EXPECT_EQ(reports, (std::vector<std::string>{"missing.pcap is not there",
+    EXPECT_EQ(reports, (std::vector<std::string>{"missing.pcap is not there.",
                                                  "b.pcap ends in the middle of a packet."}));
 }
 

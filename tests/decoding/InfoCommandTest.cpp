@@ -1,20 +1,16 @@
 #include "decoding/InfoCommand.h"
 
-#include "console/Output.h"
-#include "decoding/RequiredTemplates.h"
-#include "tests/decoding/ScriptedRadio.h"
+#include "tests/decoding/CommandFixture.h"
 #include "tests/doubles/ManualClock.h"
 #include "tests/doubles/Property.h"
 #include "tests/doubles/RecordBuilder.h"
 
-#include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
 namespace pallax {
 namespace {
 
 using doubles::Record;
-using doubles::ScriptedRecording;
 using std::chrono::milliseconds;
 using std::chrono::seconds;
 
@@ -22,34 +18,21 @@ constexpr LogCode kIdleMeasurement = 0xB17F;
 constexpr std::size_t kIdleMeasurementLength = 33;
 constexpr LogCode kServingCell = 0xB0C1;
 
-std::string textOf(const ByteBuffer& bytes) {
-    return {bytes.begin(), bytes.end()};
-}
 std::string idleMeasurement(std::size_t length = kIdleMeasurementLength) {
     return textOf(Record(kIdleMeasurement).padTo(length).prefixed());
 }
 
-class InfoCommandTest : public testing::Test {
+class InfoCommandTest : public CommandFixture {
 protected:
-    void add(const std::string& name, std::vector<ScriptedRecording::Packet> packets,
-             std::string_view technology = "lte",
+    void add(const std::string& name, Packets packets, std::string_view technology = "lte",
              std::optional<RecordingError> atEnd = std::nullopt) {
         options.files.push_back(name);
-        recordings[name] = std::make_unique<ScriptedRecording>(
-            name, std::move(packets), technologyOfCommandName(technology), std::move(atEnd));
+        script(name, std::move(packets), technologyOfCommandName(technology), std::move(atEnd));
     }
     ExitStatus run() {
         const DirectoryResources resources(PALLAX_SOURCE_DIR "/resources");
-        const auto open = [this](const std::string& path) -> Recording::OpenResult {
-            const auto found = recordings.find(path);
-            if (found == recordings.end()) {
-                return RecordingError{RecordingError::Kind::CannotOpen, path + " is not there"};
-            }
-            return std::move(found->second);
-        };
-        const auto report = [this](std::string_view sentence) { reports.emplace_back(sentence); };
-        Output output([this](std::string_view block) { written += block; });
-        return InfoCommand(options, {resources, zone, open, report}).run(output);
+        Output output(write());
+        return InfoCommand(options, {resources, zone, open(), report()}).run(output);
     }
     nlohmann::ordered_json json() {
         options.json = true;
@@ -58,10 +41,7 @@ protected:
     }
 
     InfoOptions options;
-    std::map<std::string, std::unique_ptr<Recording>> recordings;
     doubles::ManualClock zone;
-    std::string written;
-    std::vector<std::string> reports;
 };
 
 TEST_F(InfoCommandTest, TextTellsEverythingAtAGlance) {
@@ -143,7 +123,7 @@ TEST_F(InfoCommandTest, ADamagedFileIsDescribedAsFarAsItIsWhole) {
     add("whole.pcap", {});
     EXPECT_EQ(run(), kExitFailure);
     EXPECT_EQ(reports, (std::vector<std::string>{"cut.pcap ends in the middle of a packet.",
-                                                 "missing.pcap is not there"}));
+                                                 "missing.pcap is not there."}));
     EXPECT_TRUE(
         written.starts_with("cut.pcap\n  format      script\n  technology  lte (link type 150)\n"
                             "  packets     1\n"));
@@ -162,7 +142,7 @@ TEST_F(InfoCommandTest, OfAForeignTechnologyOnlyTimesAreTold) {
 }
 
 TEST_F(InfoCommandTest, ManyIrregularStampsAreCountedButNotListed) {
-    std::vector<ScriptedRecording::Packet> packets;
+    Packets packets;
     for (int number = 0; number < 20; ++number) {
         packets.push_back({seconds(100 * number), ""});
     }
