@@ -14,6 +14,7 @@ constexpr const char* kDecodeFooter = R"(Examples:
   pallax decode --every tick --from +90s --to -5m drive.pcap
   pallax decode --format csv --select '*.measured_rsrp' drive.pcap
   pallax decode --every tick --where 'measured_rsrp < -100' drive.pcap
+  pallax decode --samples --select '*.measured_rsrp' drive.pcap
   pallax decode --join drive-0001.pcapng drive-0002.pcapng
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
@@ -40,6 +41,11 @@ ticks, the packets, or the end. It is an expression of SQL on a row of the table
 ages in seconds (measured_rsrp_age). NULL does not hold. In CSV, the changes are
 then those since the display that was written before.
 
+With --samples a line has the time and number of the packet, the field, the
+place of its list entry ("index", from 1) and what identifies it ("entry"), the
+number in the record ("raw"), the value, which is a number if it has one, and
+its unit; what is missing is null. Fields that no display shows are among them.
+
 With --join the recordings must have one technology. They are read in the order
 of their first packets, and each continues the state of the one before.
 
@@ -61,11 +67,19 @@ void addChoices(CLI::App& app, DecodeOptions& options) {
                             "JSON, one object per line, or CSV (default: json)");
 }
 
+void addViews(CLI::App& app, DecodeOptions& options) {
+    app.add_flag_callback(
+           "--samples", [&options] { options.view = DecodeView::Samples; },
+           "Write each value that is read from a packet, not displays")
+        ->excludes("--every");
+}
+
 void addTimes(CLI::App& app, DecodeOptions& options) {
     addTime(app, "--from", options.window.from, "Write no displays before this time");
     addTime(app, "--to", options.window.to, "Stop reading after this time");
     addTime(app, "--at", options.at, "Write the display at this time only")
         ->excludes("--every")
+        ->excludes("--samples")
         ->excludes("--from")
         ->excludes("--to");
 }
@@ -91,6 +105,7 @@ void addContent(CLI::App& app, DecodeOptions& options) {
 
 void addDecode(CLI::App& app, DecodeOptions& options) {
     addChoices(app, options);
+    addViews(app, options);
     addTimes(app, options);
     addContent(app, options);
     app.add_option("--system-log", options.systemLog, "Write every system-log line to this file")
@@ -119,6 +134,12 @@ std::string decodeRefusal(const DecodeOptions& options) {
     }
     if (options.typed && options.format != DecodeFormat::Json) {
         return "--typed requires --format json";
+    }
+    if (options.typed && options.view != DecodeView::Displays) {
+        return "--samples writes numbers with their units, without --typed";
+    }
+    if (options.where && options.view == DecodeView::Samples) {
+        return "--where chooses displays, and --samples writes none";
     }
     return {};
 }

@@ -4,6 +4,7 @@
 #include "decoding/JoinedRecording.h"
 #include "decoding/Preconditions.h"
 #include "decoding/RecordingSpan.h"
+#include "decoding/SampleOutput.h"
 #include "decoding/SelectedOutput.h"
 #include "decoding/StampSentence.h"
 #include "host/Snapshot.h"
@@ -14,6 +15,12 @@
 namespace pallax {
 
 std::unique_ptr<DisplayOutput> DecodeCommand::displayOutput(Output& output, bool withHeader) const {
+    if (_options.view == DecodeView::Samples) {
+        if (withHeader && _options.format == DecodeFormat::Csv) {
+            SampleOutput::appendHead(output.text(), _options.recordingColumn);
+        }
+        return nullptr; // each recording has its own
+    }
     if (_options.format == DecodeFormat::Csv) {
         const auto names =
             _options.recordingColumn ? CsvOutput::Names::Column : CsvOutput::Names::Left;
@@ -28,7 +35,7 @@ ExitStatus DecodeCommand::run(Output& output) {
     ExitStatus status = kExitSuccess;
     const std::size_t count = _options.join ? 1 : _options.recordings.size();
     for (std::size_t place = 0; place < count; ++place) {
-        const ExitStatus result = decodeNext(place, {output, *displays});
+        const ExitStatus result = decodeNext(place, {output, displays.get()});
         status = result == kExitSuccess ? status : result;
         output.flush(); // the next recording may have to be waited for
         if (result == kExitFatalRecord || result == kExitWrongUsage) {
@@ -40,7 +47,7 @@ ExitStatus DecodeCommand::run(Output& output) {
 
 ExitStatus DecodeCommand::runOne(std::size_t recording, Output& output) {
     const auto displays = displayOutput(output, recording == 0);
-    const ExitStatus status = decodeNext(recording, {output, *displays});
+    const ExitStatus status = decodeNext(recording, {output, displays.get()});
     output.flush();
     return status;
 }
@@ -73,23 +80,36 @@ ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destin
     if (technology == nullptr) {
         return failed(recording.foreignLinkType().sentence);
     }
-    destination.displays.nameRecording(recording.name());
+    if (_options.view == DecodeView::Samples) {
+        return isSnapshot ? failed(noTimeOfSnapshot(recording.name()).sentence)
+                          : decodeSamples(recording, *technology, destination.output);
+    }
+    destination.displays->nameRecording(recording.name());
     if (_options.select.empty()) {
         return decodeWith(recording, *technology, destination);
     }
-    SelectedOutput selected(destination.displays,
+    SelectedOutput selected(*destination.displays,
                             {_options.select, *technology, _environment.resources});
-    return decodeWith(recording, *technology, {destination.output, selected});
+    return decodeWith(recording, *technology, {destination.output, &selected});
+}
+
+ExitStatus DecodeCommand::decodeSamples(Recording& recording, const RecordedTechnology& technology,
+                                        Output& output) {
+    SampleOutput samples(output,
+                         {_options.format, _options.select,
+                          _options.recordingColumn ? recording.name() : std::string()},
+                         FieldTable(technology, _environment.resources));
+    return decodeWith(recording, technology, {output, &samples, &samples});
 }
 
 ExitStatus DecodeCommand::decodeWith(Recording& recording, const RecordedTechnology& technology,
                                      const Destination& destination) {
     DecodeWindow window(_options.chosenWindow());
-    const auto condition = conditioned(recording, technology, destination.displays);
+    const auto condition = conditioned(recording, technology, *destination.displays);
     if (!condition) {
         return condition.error();
     }
-    DisplayOutput& chosen = *condition != nullptr ? **condition : destination.displays;
+    DisplayOutput& chosen = *condition != nullptr ? **condition : *destination.displays;
     WindowedOutput displays(chosen, window, _options.chosenEvery());
     RecordingDecoder decoder(_environment, technology.identifier, _options.chosenEvery(), displays);
     if (!decoder.hasGenerator()) {
@@ -97,6 +117,9 @@ ExitStatus DecodeCommand::decodeWith(Recording& recording, const RecordedTechnol
     }
     if (*condition != nullptr) {
         decoder.addSampleSink((*condition)->sink());
+    }
+    if (destination.samples != nullptr) {
+        decoder.addSampleSink(*destination.samples);
     }
     if (const auto span = spanBefore(recording)) {
         if (const auto sentence = window.open(*span, _zone)) {

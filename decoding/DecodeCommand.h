@@ -15,12 +15,14 @@
 
 namespace pallax {
 
-enum class DecodeFormat { Json, Csv };
+/// What is written of a recording.
+enum class DecodeView { Displays, Samples };
 
 struct DecodeOptions {
     std::vector<std::string> recordings;
     /// The technology of every recording, overriding its link type.
     const RecordedTechnology* technology = nullptr;
+    DecodeView view = DecodeView::Displays;
     /// If missing: the last display or, for CSV, which shows changes, every tick.
     std::optional<Every> every;
     DecodeFormat format = DecodeFormat::Json;
@@ -40,8 +42,8 @@ struct DecodeOptions {
         return at ? DecodeWindow::Texts{std::nullopt, at} : window;
     }
     Every chosenEvery() const {
-        return at ? Every::End
-                  : every.value_or(format == DecodeFormat::Csv ? Every::Tick : Every::End);
+        const bool isSeries = format == DecodeFormat::Csv || view == DecodeView::Samples;
+        return at ? Every::End : every.value_or(isSeries ? Every::Tick : Every::End);
     }
 };
 
@@ -81,7 +83,8 @@ public:
 private:
     struct Destination {
         Output& output;
-        DisplayOutput& displays; // which writes to it
+        DisplayOutput* displays;       // which writes to it; null if each recording has its own
+        SampleSink* samples = nullptr; // gets the samples, too
     };
 
     static std::chrono::seconds utc(Time /*time*/) { return {}; }
@@ -90,6 +93,8 @@ private:
     ExitStatus decodeNext(std::size_t place, const Destination& destination);
     ExitStatus decodeOpened(const Recording::OpenResult& recording, const Destination& destination);
     ExitStatus decode(Recording& recording, const Destination& destination);
+    ExitStatus decodeSamples(Recording& recording, const RecordedTechnology& technology,
+                             Output& output);
     ExitStatus decodeWith(Recording& recording, const RecordedTechnology& technology,
                           const Destination& destination);
     /// Reports what is wrong with the condition.

@@ -56,6 +56,11 @@ public:
             _output.show(moment, display);
         }
     }
+    void packetDone(const DisplayMoment& moment) override {
+        if (_window.contains(moment.time)) {
+            _output.packetDone(moment);
+        }
+    }
 
 private:
     DisplayOutput& _output;

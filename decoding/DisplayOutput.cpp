@@ -11,18 +11,8 @@ namespace {
 constexpr std::string_view kHeader = "time,path,value,number,unit\n";
 constexpr std::string_view kNoCells = ",,";
 
-std::string textOf(const PropertyList& value) {
-    std::string text;
-    if (value.appendString(text)) {
-        return text;
-    }
-    appendJson(text, value);
-    const bool quoted = text.front() == '"'; // base64 or a date, which hold nothing escaped
-    return quoted ? text.substr(1, text.size() - 2) : text;
-}
-
 std::string cellsOf(const PropertyList& value) {
-    const std::string text = textOf(value);
+    const std::string text = textOfValue(value);
     std::string cells;
     appendCsvCell(cells, text);
     cells += ',';
@@ -40,6 +30,16 @@ std::string cellsOf(const PropertyList& value) {
 }
 
 } // namespace
+
+std::string textOfValue(const PropertyList& value) {
+    std::string text;
+    if (value.appendString(text)) {
+        return text;
+    }
+    appendJson(text, value);
+    const bool quoted = text.front() == '"'; // base64 or a date, which hold nothing escaped
+    return quoted ? text.substr(1, text.size() - 2) : text;
+}
 
 void JsonOutput::show(const DisplayMoment& moment, const PropertyList& display) {
     std::string& text = _output.text();

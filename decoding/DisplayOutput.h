@@ -12,6 +12,8 @@
 
 namespace pallax {
 
+enum class DecodeFormat { Json, Csv };
+
 /// How often a recording's display is shown.
 enum class Every { End, Tick, Packet };
 
@@ -31,7 +33,12 @@ public:
     virtual void beginRecording() = 0;
     /// `display` is null if there is none yet.
     virtual void show(const DisplayMoment& moment, const PropertyList& display) = 0;
+    /// A packet has been read completely; called before the next `show`.
+    virtual void packetDone(const DisplayMoment& /*moment*/) {}
 };
+
+/// A value as the text of one cell: containers as JSON.
+std::string textOfValue(const PropertyList& value);
 
 /// One JSON object per line: the display itself with Every::End, otherwise
 /// {"tick":1,"time":"2023-11-14T22:13:20.000Z","display":{…}}, with "packet" instead of "tick" for

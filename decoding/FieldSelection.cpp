@@ -11,8 +11,8 @@ namespace pallax {
 
 namespace {
 
-bool hasName(const FieldInfo& field, const std::string& name) {
-    return ::fnmatch(name.c_str(), field.name.c_str(), 0) == 0;
+bool hasName(const std::string& field, const std::string& name) {
+    return ::fnmatch(name.c_str(), field.c_str(), 0) == 0;
 }
 
 } // namespace
@@ -30,7 +30,7 @@ FieldSelection::FieldSelection(const std::vector<std::string>& names,
 void FieldSelection::add(const std::vector<std::string>& names, const FieldRegistry& registry) {
     for (const FieldInfo& field : registry.fields()) {
         if (std::any_of(names.begin(), names.end(),
-                        [&field](const std::string& name) { return hasName(field, name); })) {
+                        [&field](const std::string& name) { return hasName(field.name, name); })) {
             _paths.insert(field.path);
         }
     }
@@ -43,8 +43,9 @@ std::optional<std::string> FieldSelection::unknownName(const std::vector<std::st
         const FieldRegistry registry(gatherReference(technology, resources));
         const auto& fields = registry.fields();
         std::erase_if(unknown, [&fields](const std::string& name) {
-            return std::any_of(fields.begin(), fields.end(),
-                               [&name](const FieldInfo& field) { return hasName(field, name); });
+            return std::any_of(fields.begin(), fields.end(), [&name](const FieldInfo& field) {
+                return hasName(field.name, name);
+            });
         });
     }
     return unknown.empty() ? std::nullopt : std::optional(unknown.front());
@@ -114,6 +115,12 @@ std::optional<PropertyList> FieldSelection::entriesOf(const Dictionary& entries,
         }
     }
     return isEmpty ? std::nullopt : std::optional<PropertyList>(std::move(selected));
+}
+
+bool ChosenFields::isNamed(const std::string& field) const {
+    return _names.empty() ||
+           std::any_of(_names.begin(), _names.end(),
+                       [&field](const std::string& name) { return hasName(field, name); });
 }
 
 } // namespace pallax

@@ -2,11 +2,13 @@
 
 #include "fields/FieldRegistry.h"
 #include "plist/PropertyList.h"
+#include "timeline/FieldTable.h"
 
 #include <optional>
 #include <set>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 namespace pallax {
@@ -38,6 +40,29 @@ private:
     std::optional<PropertyList> entriesOf(const Dictionary& entries, const std::string& path) const;
 
     std::set<std::string> _paths; ///< in the display
+};
+
+/// The fields of one recording that are chosen by name; of an object stream, also those that come
+/// later.
+class ChosenFields {
+public:
+    /// Without names, all. The fields must outlive it.
+    ChosenFields(std::vector<std::string> names, const FieldTable& fields)
+        : _names(std::move(names)), _fields(fields) {}
+
+    bool has(FieldIndex field) {
+        while (_isChosen.size() <= field) {
+            _isChosen.push_back(isNamed(_fields[static_cast<FieldIndex>(_isChosen.size())].name));
+        }
+        return _isChosen[field];
+    }
+
+private:
+    bool isNamed(const std::string& field) const;
+
+    std::vector<std::string> _names;
+    const FieldTable& _fields;
+    std::vector<bool> _isChosen; ///< by field, as far as it was asked
 };
 
 } // namespace pallax

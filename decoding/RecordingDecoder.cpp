@@ -29,6 +29,7 @@ std::optional<std::string> RecordingDecoder::add(const RecordedPacket& packet) {
     } catch (const std::exception& error) {
         return error.what();
     }
+    _output.packetDone({_packets, packet.time});
     _unseenBytes += packet.data.size();
     if (_unseenBytes > kMostUnseenBytes) {
         (void)generate(packet.time);

@@ -78,6 +78,7 @@ public:
     void beginPacket(const SamplePacket& packet) override {
         _section = {};
         _time = packet.time;
+        _open.clear(); // a record may have thrown in a list
     }
     void beginList(const SampleList& list) override;
     void endList() override;

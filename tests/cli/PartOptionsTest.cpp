@@ -39,6 +39,22 @@ TEST(Options, DecodeTakesAPartOfARecording) {
               "pallax: --typed requires --format json (see pallax decode --help)\n");
 }
 
+TEST(Options, DecodeWritesSamples) {
+    const auto samples = parsed<DecodeOptions>({"decode", "--samples", "a.pcap"});
+    EXPECT_EQ(samples.view, DecodeView::Samples);
+    EXPECT_EQ(samples.chosenEvery(), Every::Tick);
+    const auto refused = [](std::vector<std::string> arguments) {
+        arguments.insert(arguments.begin(), {"decode", "a.pcap", "--samples"});
+        return ended(arguments).text;
+    };
+    EXPECT_EQ(refused({"--every", "tick"}),
+              "pallax: --every excludes --samples (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--at", "end"}),
+              "pallax: --samples excludes --at (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--typed"}), "pallax: --samples writes numbers with their units, without "
+                                    "--typed (see pallax decode --help)\n");
+}
+
 TEST(Options, SnapshotTakesAFile) {
     const auto log = parsed<SnapshotOptions>({"snapshot", "--dlf", "a.pallax"});
     EXPECT_EQ(log.file, "a.pallax");
