@@ -15,6 +15,7 @@ constexpr const char* kDecodeFooter = R"(Examples:
   pallax decode --format csv --select '*.measured_rsrp' drive.pcap
   pallax decode --every tick --where 'measured_rsrp < -100' drive.pcap
   pallax decode --samples --select '*.measured_rsrp' drive.pcap
+  pallax decode --wide --select '*.measured_rsrp' drive.pcap > rsrp.csv
   pallax decode --join drive-0001.pcapng drive-0002.pcapng
 
 Ticks are 2.0 s of recording time apart, counted from the first packet. "-" is
@@ -46,6 +47,13 @@ place of its list entry ("index", from 1) and what identifies it ("entry"), the
 number in the record ("raw"), the value, which is a number if it has one, and
 its unit; what is missing is null. Fields that no display shows are among them.
 
+With --wide a column is called as its field, in a list with what identifies the
+entry, which is the same wherever the entry stands:
+lte.neighbor_cells_list.measured_rsrp[Physical Cell ID 275, E-ARFCN 1850]. There
+is one for each field that the recording has, so choose some with --select. A
+row has the current values at a tick (--every packet: after each packet);
+numbers have no units. The recording is read twice and cannot be a pipe.
+
 With --join the recordings must have one technology. They are read in the order
 of their first packets, and each continues the state of the one before.
 
@@ -62,9 +70,9 @@ void addChoices(CLI::App& app, DecodeOptions& options) {
         app, "--every", options.every,
         {{"end", Every::End}, {"tick", Every::Tick}, {"packet", Every::Packet}},
         "When to write the display (default: end; for csv, tick)");
-    addChoice<DecodeFormat>(app, "--format", options.format,
-                            {{"json", DecodeFormat::Json}, {"csv", DecodeFormat::Csv}},
-                            "JSON, one object per line, or CSV (default: json)");
+    addChoice<std::optional<DecodeFormat>>(
+        app, "--format", options.format, {{"json", DecodeFormat::Json}, {"csv", DecodeFormat::Csv}},
+        "JSON, one object per line, or CSV (default: json)");
 }
 
 void addViews(CLI::App& app, DecodeOptions& options) {
@@ -72,6 +80,10 @@ void addViews(CLI::App& app, DecodeOptions& options) {
            "--samples", [&options] { options.view = DecodeView::Samples; },
            "Write each value that is read from a packet, not displays")
         ->excludes("--every");
+    app.add_flag_callback(
+           "--wide", [&options] { options.view = DecodeView::Wide; },
+           "CSV with a column for each field and a row for each tick")
+        ->excludes("--samples");
 }
 
 void addTimes(CLI::App& app, DecodeOptions& options) {
@@ -129,14 +141,20 @@ void addDecode(CLI::App& app, DecodeOptions& options) {
 }
 
 std::string decodeRefusal(const DecodeOptions& options) {
-    if (options.recordingColumn && options.format != DecodeFormat::Csv) {
-        return "--recording-column requires --format csv";
+    if (options.view == DecodeView::Wide && options.chosenFormat() != DecodeFormat::Csv) {
+        return "--wide requires --format csv";
     }
-    if (options.typed && options.format != DecodeFormat::Json) {
-        return "--typed requires --format json";
+    if (options.view == DecodeView::Wide && options.recordings.size() > 1 && !options.join) {
+        return "--wide takes one recording, or several with --join";
     }
     if (options.typed && options.view != DecodeView::Displays) {
-        return "--samples writes numbers with their units, without --typed";
+        return "--typed excludes --samples and --wide";
+    }
+    if (options.recordingColumn && options.chosenFormat() != DecodeFormat::Csv) {
+        return "--recording-column requires --format csv";
+    }
+    if (options.typed && options.chosenFormat() != DecodeFormat::Json) {
+        return "--typed requires --format json";
     }
     if (options.where && options.view == DecodeView::Samples) {
         return "--where chooses displays, and --samples writes none";

@@ -7,7 +7,9 @@
 #include "decoding/SampleOutput.h"
 #include "decoding/SelectedOutput.h"
 #include "decoding/StampSentence.h"
+#include "decoding/WideOutput.h"
 #include "host/Snapshot.h"
+#include "platform/SystemLog.h"
 #include "text/Format.h"
 
 #include <utility>
@@ -16,12 +18,15 @@ namespace pallax {
 
 std::unique_ptr<DisplayOutput> DecodeCommand::displayOutput(Output& output, bool withHeader) const {
     if (_options.view == DecodeView::Samples) {
-        if (withHeader && _options.format == DecodeFormat::Csv) {
+        if (withHeader && _options.chosenFormat() == DecodeFormat::Csv) {
             SampleOutput::appendHead(output.text(), _options.recordingColumn);
         }
-        return nullptr; // each recording has its own
+        return nullptr;
     }
-    if (_options.format == DecodeFormat::Csv) {
+    if (_options.view == DecodeView::Wide) {
+        return nullptr;
+    }
+    if (_options.chosenFormat() == DecodeFormat::Csv) {
         const auto names =
             _options.recordingColumn ? CsvOutput::Names::Column : CsvOutput::Names::Left;
         return std::make_unique<CsvOutput>(output, withHeader, names);
@@ -80,9 +85,13 @@ ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destin
     if (technology == nullptr) {
         return failed(recording.foreignLinkType().sentence);
     }
-    if (_options.view == DecodeView::Samples) {
-        return isSnapshot ? failed(noTimeOfSnapshot(recording.name()).sentence)
-                          : decodeSamples(recording, *technology, destination.output);
+    if (_options.view != DecodeView::Displays) {
+        if (isSnapshot) {
+            return failed(noTimeOfSnapshot(recording.name()).sentence);
+        }
+        return _options.view == DecodeView::Wide
+                   ? decodeWide(recording, *technology, destination.output)
+                   : decodeSamples(recording, *technology, destination.output);
     }
     destination.displays->nameRecording(recording.name());
     if (_options.select.empty()) {
@@ -96,10 +105,42 @@ ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destin
 ExitStatus DecodeCommand::decodeSamples(Recording& recording, const RecordedTechnology& technology,
                                         Output& output) {
     SampleOutput samples(output,
-                         {_options.format, _options.select,
+                         {_options.chosenFormat(), _options.select,
                           _options.recordingColumn ? recording.name() : std::string()},
                          FieldTable(technology, _environment.resources));
     return decodeWith(recording, technology, {output, &samples, &samples});
+}
+
+ExitStatus DecodeCommand::decodeWide(Recording& recording, const RecordedTechnology& technology,
+                                     Output& output) {
+    if (recording.isStream()) {
+        return failed(recording.name() + ": --wide needs a file, because the columns must be known "
+                                         "before the first row.");
+    }
+    const auto first = openWhole(_place);
+    if (!first) {
+        return failed(first.error().sentence);
+    }
+    WideOutput wide(output,
+                    {_options.select, _options.chosenEvery(),
+                     _options.recordingColumn ? recording.name() : std::string()},
+                    FieldTable(technology, _environment.resources));
+    const Destination destination{output, &wide, &wide.samples()};
+    {
+        // What is odd is told by the second pass.
+        const MutedSystemLog muted;
+        const auto report = std::exchange(_report, [](std::string_view /*sentence*/) {});
+        auto* const watcher = std::exchange(_watcher, nullptr);
+        (void)decodeWith(**first, technology, destination);
+        _report = report;
+        _watcher = watcher;
+    }
+    if (wide.hasTooManyColumns()) {
+        return failed(formatText("%@ has more than %zu columns; choose fields with --select.",
+                                 {recording.name(), WideOutput::kMostColumns}));
+    }
+    wide.beginRows();
+    return decodeWith(recording, technology, destination);
 }
 
 ExitStatus DecodeCommand::decodeWith(Recording& recording, const RecordedTechnology& technology,
@@ -111,7 +152,11 @@ ExitStatus DecodeCommand::decodeWith(Recording& recording, const RecordedTechnol
     }
     DisplayOutput& chosen = *condition != nullptr ? **condition : *destination.displays;
     WindowedOutput displays(chosen, window, _options.chosenEvery());
-    RecordingDecoder decoder(_environment, technology.identifier, _options.chosenEvery(), displays);
+    // Values need no display for each packet.
+    const Every every = destination.samples != nullptr && _options.chosenEvery() == Every::Packet
+                            ? Every::Tick
+                            : _options.chosenEvery();
+    RecordingDecoder decoder(_environment, technology.identifier, every, displays);
     if (!decoder.hasGenerator()) {
         return failed(noGeneratorSentence(recording.name(), technology.identifier));
     }

@@ -16,7 +16,7 @@
 namespace pallax {
 
 /// What is written of a recording.
-enum class DecodeView { Displays, Samples };
+enum class DecodeView { Displays, Samples, Wide };
 
 struct DecodeOptions {
     std::vector<std::string> recordings;
@@ -25,8 +25,8 @@ struct DecodeOptions {
     DecodeView view = DecodeView::Displays;
     /// If missing: the last display or, for CSV, which shows changes, every tick.
     std::optional<Every> every;
-    DecodeFormat format = DecodeFormat::Json;
-    std::optional<std::string> systemLog; ///< path of a text file
+    std::optional<DecodeFormat> format = {}; ///< if missing: CSV where there is no other, else JSON
+    std::optional<std::string> systemLog;    ///< path of a text file
     bool strict = false;
     /// How many recordings are decoded at once; if missing, one per core.
     std::optional<unsigned> jobs;
@@ -41,8 +41,11 @@ struct DecodeOptions {
     DecodeWindow::Texts chosenWindow() const {
         return at ? DecodeWindow::Texts{std::nullopt, at} : window;
     }
+    DecodeFormat chosenFormat() const {
+        return format.value_or(view == DecodeView::Wide ? DecodeFormat::Csv : DecodeFormat::Json);
+    }
     Every chosenEvery() const {
-        const bool isSeries = format == DecodeFormat::Csv || view == DecodeView::Samples;
+        const bool isSeries = chosenFormat() == DecodeFormat::Csv || view == DecodeView::Samples;
         return at ? Every::End : every.value_or(isSeries ? Every::Tick : Every::End);
     }
 };
@@ -89,12 +92,15 @@ private:
 
     static std::chrono::seconds utc(Time /*time*/) { return {}; }
 
+    /// Null if each recording has its own.
     std::unique_ptr<DisplayOutput> displayOutput(Output& output, bool withHeader) const;
     ExitStatus decodeNext(std::size_t place, const Destination& destination);
     ExitStatus decodeOpened(const Recording::OpenResult& recording, const Destination& destination);
     ExitStatus decode(Recording& recording, const Destination& destination);
     ExitStatus decodeSamples(Recording& recording, const RecordedTechnology& technology,
                              Output& output);
+    ExitStatus decodeWide(Recording& recording, const RecordedTechnology& technology,
+                          Output& output);
     ExitStatus decodeWith(Recording& recording, const RecordedTechnology& technology,
                           const Destination& destination);
     /// Reports what is wrong with the condition.

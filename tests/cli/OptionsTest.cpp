@@ -57,7 +57,7 @@ TEST(Options, DecodeWritesTheLastDisplayAsJsonUnlessToldOtherwise) {
     EXPECT_EQ(plain.recordings, (std::vector<std::string>{"a.pcap", "b.pcap"}));
     EXPECT_EQ(plain.technology, nullptr);
     EXPECT_EQ(plain.chosenEvery(), Every::End);
-    EXPECT_EQ(plain.format, DecodeFormat::Json);
+    EXPECT_EQ(plain.chosenFormat(), DecodeFormat::Json);
     EXPECT_EQ(plain.systemLog, std::nullopt);
     EXPECT_FALSE(plain.strict);
 

@@ -51,8 +51,27 @@ TEST(Options, DecodeWritesSamples) {
               "pallax: --every excludes --samples (see pallax decode --help)\n");
     EXPECT_EQ(refused({"--at", "end"}),
               "pallax: --samples excludes --at (see pallax decode --help)\n");
-    EXPECT_EQ(refused({"--typed"}), "pallax: --samples writes numbers with their units, without "
-                                    "--typed (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--typed"}),
+              "pallax: --typed excludes --samples and --wide (see pallax decode --help)\n");
+}
+
+TEST(Options, DecodeWritesColumns) {
+    const auto wide = parsed<DecodeOptions>({"decode", "--wide", "a.pcap"});
+    EXPECT_EQ(wide.view, DecodeView::Wide);
+    EXPECT_EQ(wide.chosenFormat(), DecodeFormat::Csv);
+    EXPECT_EQ(wide.chosenEvery(), Every::Tick);
+    EXPECT_EQ(parsed<DecodeOptions>({"decode", "--wide", "--join", "a", "b"}).recordings.size(),
+              2U);
+    const auto refused = [](std::vector<std::string> arguments) {
+        arguments.insert(arguments.begin(), {"decode", "a.pcap", "--wide"});
+        return ended(arguments).text;
+    };
+    EXPECT_EQ(refused({"b.pcap"}), "pallax: --wide takes one recording, or several with --join "
+                                   "(see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--format", "json"}),
+              "pallax: --wide requires --format csv (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--samples"}),
+              "pallax: --samples excludes --wide (see pallax decode --help)\n");
 }
 
 TEST(Options, SnapshotTakesAFile) {

@@ -83,7 +83,7 @@ inline constexpr Technology kScriptedTechnologies[] = {
 inline constexpr RecordedTechnology kScriptedLte{150, "Zorell_LTE", "lte"};
 inline constexpr RecordedTechnology kUnknownToGenerators{0, "Another", "other"};
 
-class ScriptedRecording final : public Recording {
+class ScriptedRecording : public Recording {
 public:
     struct Packet {
         std::chrono::milliseconds sinceFirst;
