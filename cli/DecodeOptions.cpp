@@ -15,6 +15,7 @@ constexpr const char* kDecodeFooter = R"(Examples:
   pallax decode --format csv --select '*.measured_rsrp' drive.pcap
   pallax decode --every tick --where 'measured_rsrp < -100' drive.pcap
   pallax decode --samples --select '*.measured_rsrp' drive.pcap
+  pallax decode --table 'Neighbor Cells List' --at 14:03 drive.pcap
   pallax decode --wide --select '*.measured_rsrp' drive.pcap > rsrp.csv
   pallax decode --join drive-0001.pcapng drive-0002.pcapng
 
@@ -54,6 +55,10 @@ is one for each field that the recording has, so choose some with --select. A
 row has the current values at a tick (--every packet: after each packet);
 numbers have no units. The recording is read twice and cannot be a pipe.
 
+A SECTION of --table is named as on the screen, or as in the names of its fields
+(neighbor_cells_list); a list inside a section, with both names. The table is
+for people, with each unit in the head.
+
 With --join the recordings must have one technology. They are read in the order
 of their first packets, and each continues the state of the one before.
 
@@ -84,6 +89,18 @@ void addViews(CLI::App& app, DecodeOptions& options) {
            "--wide", [&options] { options.view = DecodeView::Wide; },
            "CSV with a column for each field and a row for each tick")
         ->excludes("--samples");
+    app.add_option_function<std::string>(
+           "--table",
+           [&options](const std::string& section) {
+               options.view = DecodeView::Table;
+               options.table = section;
+           },
+           "Write a section or list as a table, at the end or --at a time")
+        ->type_name("SECTION")
+        ->excludes("--samples")
+        ->excludes("--wide")
+        ->excludes("--every")
+        ->excludes("--format");
 }
 
 void addTimes(CLI::App& app, DecodeOptions& options) {
@@ -148,7 +165,7 @@ std::string decodeRefusal(const DecodeOptions& options) {
         return "--wide takes one recording, or several with --join";
     }
     if (options.typed && options.view != DecodeView::Displays) {
-        return "--typed excludes --samples and --wide";
+        return "--typed writes displays, not values, columns or a table";
     }
     if (options.recordingColumn && options.chosenFormat() != DecodeFormat::Csv) {
         return "--recording-column requires --format csv";

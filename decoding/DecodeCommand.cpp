@@ -7,11 +7,15 @@
 #include "decoding/SampleOutput.h"
 #include "decoding/SelectedOutput.h"
 #include "decoding/StampSentence.h"
+#include "decoding/TableOutput.h"
 #include "decoding/WideOutput.h"
 #include "host/Snapshot.h"
 #include "platform/SystemLog.h"
 #include "text/Format.h"
+#include "text/Printable.h"
+#include "text/Suggestion.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace pallax {
@@ -23,7 +27,7 @@ std::unique_ptr<DisplayOutput> DecodeCommand::displayOutput(Output& output, bool
         }
         return nullptr;
     }
-    if (_options.view == DecodeView::Wide) {
+    if (_options.view != DecodeView::Displays) {
         return nullptr;
     }
     if (_options.chosenFormat() == DecodeFormat::Csv) {
@@ -86,12 +90,7 @@ ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destin
         return failed(recording.foreignLinkType().sentence);
     }
     if (_options.view != DecodeView::Displays) {
-        if (isSnapshot) {
-            return failed(noTimeOfSnapshot(recording.name()).sentence);
-        }
-        return _options.view == DecodeView::Wide
-                   ? decodeWide(recording, *technology, destination.output)
-                   : decodeSamples(recording, *technology, destination.output);
+        return decodeView(recording, *technology, destination.output);
     }
     destination.displays->nameRecording(recording.name());
     if (_options.select.empty()) {
@@ -100,6 +99,51 @@ ExitStatus DecodeCommand::decode(Recording& recording, const Destination& destin
     SelectedOutput selected(*destination.displays,
                             {_options.select, *technology, _environment.resources});
     return decodeWith(recording, *technology, {destination.output, &selected});
+}
+
+ExitStatus DecodeCommand::decodeView(Recording& recording, const RecordedTechnology& technology,
+                                     Output& output) {
+    if (_options.view == DecodeView::Table) {
+        return decodeTable(recording, technology, output);
+    }
+    if (&technology == &kSnapshotTechnology) {
+        return failed(noTimeOfSnapshot(recording.name()).sentence);
+    }
+    return _options.view == DecodeView::Wide ? decodeWide(recording, technology, output)
+                                             : decodeSamples(recording, technology, output);
+}
+
+ExitStatus DecodeCommand::decodeTable(Recording& recording, const RecordedTechnology& technology,
+                                      Output& output) {
+    if (_options.recordings.size() > 1 && !_options.join) {
+        output.text().append(_place == 0 ? "" : "\n");
+        appendPrintable(output.text(), recording.name());
+        output.text() += ":\n";
+    }
+    TableOutput table(output, _options.table, technology.commandName);
+    SelectedOutput selected(table, {_options.select, technology, _environment.resources});
+    DisplayOutput* const displays =
+        _options.select.empty() ? static_cast<DisplayOutput*>(&table) : &selected;
+    const ExitStatus status = decodeWith(recording, technology, {output, displays});
+    if (status != kExitSuccess || table.isWritten()) {
+        return status;
+    }
+    std::vector<std::string> names = table.sections();
+    if (&technology != &kSnapshotTechnology) {
+        for (const auto& section : gatherReference(technology, _environment.resources).sections) {
+            names.push_back(fieldWord(section.name));
+        }
+    }
+    if (std::any_of(names.begin(), names.end(),
+                    [&table](const std::string& name) { return table.isAskedFor(name); })) {
+        _report(formatText("%@: nothing is shown in \"%@\".", {recording.name(), _options.table}));
+        return kExitSuccess;
+    }
+    std::string sentence =
+        formatText("%@ has no section \"%@\"", {recording.name(), _options.table});
+    const std::string nearest = suggestion(fieldWord(_options.table), names);
+    _report(sentence + (nearest.empty() ? "." : nearest));
+    return kExitWrongUsage;
 }
 
 ExitStatus DecodeCommand::decodeSamples(Recording& recording, const RecordedTechnology& technology,

@@ -16,7 +16,7 @@
 namespace pallax {
 
 /// What is written of a recording.
-enum class DecodeView { Displays, Samples, Wide };
+enum class DecodeView { Displays, Samples, Wide, Table };
 
 struct DecodeOptions {
     std::vector<std::string> recordings;
@@ -27,6 +27,7 @@ struct DecodeOptions {
     std::optional<Every> every;
     std::optional<DecodeFormat> format = {}; ///< if missing: CSV where there is no other, else JSON
     std::optional<std::string> systemLog;    ///< path of a text file
+    std::string table = {};                  ///< the section to write as a table
     bool strict = false;
     /// How many recordings are decoded at once; if missing, one per core.
     std::optional<unsigned> jobs;
@@ -99,6 +100,10 @@ private:
     ExitStatus decode(Recording& recording, const Destination& destination);
     ExitStatus decodeSamples(Recording& recording, const RecordedTechnology& technology,
                              Output& output);
+    ExitStatus decodeView(Recording& recording, const RecordedTechnology& technology,
+                          Output& output);
+    ExitStatus decodeTable(Recording& recording, const RecordedTechnology& technology,
+                           Output& output);
     ExitStatus decodeWide(Recording& recording, const RecordedTechnology& technology,
                           Output& output);
     ExitStatus decodeWith(Recording& recording, const RecordedTechnology& technology,

@@ -51,8 +51,8 @@ TEST(Options, DecodeWritesSamples) {
               "pallax: --every excludes --samples (see pallax decode --help)\n");
     EXPECT_EQ(refused({"--at", "end"}),
               "pallax: --samples excludes --at (see pallax decode --help)\n");
-    EXPECT_EQ(refused({"--typed"}),
-              "pallax: --typed excludes --samples and --wide (see pallax decode --help)\n");
+    EXPECT_EQ(refused({"--typed"}), "pallax: --typed writes displays, not values, columns or a "
+                                    "table (see pallax decode --help)\n");
 }
 
 TEST(Options, DecodeWritesColumns) {
@@ -72,6 +72,19 @@ TEST(Options, DecodeWritesColumns) {
               "pallax: --wide requires --format csv (see pallax decode --help)\n");
     EXPECT_EQ(refused({"--samples"}),
               "pallax: --samples excludes --wide (see pallax decode --help)\n");
+}
+
+TEST(Options, DecodeWritesATable) {
+    const auto table = parsed<DecodeOptions>({"decode", "--table", "Cell", "--at", "end", "a"});
+    EXPECT_EQ(table.view, DecodeView::Table);
+    EXPECT_EQ(table.table, "Cell");
+    EXPECT_EQ(table.chosenEvery(), Every::End);
+    for (const char* other : {"--samples", "--wide", "--every=end", "--format=json"}) {
+        const std::string name(other,
+                               std::min(std::string(other).find('='), std::string(other).size()));
+        EXPECT_EQ(ended({"decode", "--table", "Cell", other, "a"}).text,
+                  "pallax: " + name + " excludes --table (see pallax decode --help)\n");
+    }
 }
 
 TEST(Options, SnapshotTakesAFile) {
