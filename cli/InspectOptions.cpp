@@ -30,7 +30,8 @@ Contents are not checked.
 For a saved snapshot, the displays and the size of the DLF log are listed.
 Displays that share a section all show it as it was when the snapshot was saved.
 
-"fills" names the sections that the recording has data for.
+"fills" names the sections that the recording has data for. The numbered parts
+of a recording (drive-0001.pcapng, drive-0002.pcapng) are described as one.
 A file that is cut or damaged is described as far as it can be read.
 
 Exit status:
@@ -72,7 +73,8 @@ operator(mcc, mnc), cell_site(technology, identity), quality(field, value) or
 quality(field, value, profile), time_text(time) and the aggregate
 quantile(value, weight, q) are there beside those of SQLite.
 
-Several recordings are one, in the order of their times. A column of numbers is
+Several recordings are one, in the order of their times, and each continues the
+state of the one before. A column of numbers is
 NULL where the display has a text instead ("Not Present").
 
 Exit status:

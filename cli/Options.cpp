@@ -55,6 +55,11 @@ With --where, only the events for which a condition holds are listed. It is an
 expression of SQL on "kind", "words" and a row of the table "state" of pallax
 sql as it is after the event's packet: time, packet, fields and their ages.
 
+Recordings follow one another, each with its name. The numbered parts of one
+(drive-0001.pcapng, drive-0002.pcapng, as pallax record writes them) are read as
+one, in the order of their times; a part that is not given is left out, and the
+first begins without a state.
+
 A record that cannot be read ends the events of its recording. Events from a
 pipe are written when they happen.
 

@@ -1,7 +1,6 @@
 #include "decoding/DecodeCommand.h"
 
 #include "decoding/FatalRecord.h"
-#include "decoding/JoinedRecording.h"
 #include "decoding/Preconditions.h"
 #include "decoding/RecordingSpan.h"
 #include "decoding/SampleOutput.h"
@@ -9,6 +8,7 @@
 #include "decoding/StampSentence.h"
 #include "decoding/TableOutput.h"
 #include "decoding/WideOutput.h"
+#include "host/JoinedRecording.h"
 #include "host/Snapshot.h"
 #include "platform/SystemLog.h"
 #include "text/Format.h"

@@ -10,6 +10,7 @@
 #include "decoding/RequiredTemplates.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
+#include "host/JoinedRecording.h"
 #include "host/Snapshot.h"
 #include "host/WallClock.h"
 #include "text/Format.h"
@@ -66,9 +67,13 @@ std::string localText(Time time, const Clock& zone) {
 /// Writes the events that a timeline has found since the last call.
 class EventLines {
 public:
-    EventLines(const EventsOptions& options, const Clock& zone, const std::string& recording,
-               Output& output)
-        : _options(options), _zone(zone), _recording(recording), _output(output) {}
+    struct Form {
+        bool isJson;
+        bool areSeveral; ///< recordings
+    };
+
+    EventLines(const Form& form, const Clock& zone, const std::string& recording, Output& output)
+        : _form(form), _zone(zone), _recording(recording), _output(output) {}
 
     /// Writes only the events for which the condition holds.
     void setCondition(QueryCondition& condition) { _condition = &condition; }
@@ -98,10 +103,10 @@ private:
     }
     void write(const Event& event) {
         std::string& text = _output.text();
-        if (_options.json) {
+        if (_form.isJson) {
             appendJson(text, objectOf(event));
         } else {
-            if (_options.recordings.size() > 1) {
+            if (_form.areSeveral) {
                 text.append(_recording).append(": ");
             }
             constexpr std::size_t kKindWidth = 18;
@@ -125,7 +130,7 @@ private:
         };
     }
 
-    const EventsOptions& _options;
+    Form _form;
     const Clock& _zone;
     const std::string& _recording;
     Output& _output;
@@ -137,8 +142,10 @@ private:
 
 ExitStatus EventsCommand::run(Output& output) {
     ExitStatus status = kExitSuccess;
-    for (const std::string& path : _options.recordings) {
-        const ExitStatus result = tell(path, output);
+    const std::vector<PartPaths> recordings = joinedParts(_options.recordings, _open);
+    _areSeveral = recordings.size() > 1;
+    for (const PartPaths& parts : recordings) {
+        const ExitStatus result = tell(parts, output);
         status = result == kExitSuccess ? status : result;
         output.flush(); // the next recording may have to be waited for
         if (result == kExitWrongUsage) {
@@ -148,8 +155,11 @@ ExitStatus EventsCommand::run(Output& output) {
     return status;
 }
 
-ExitStatus EventsCommand::tell(const std::string& path, Output& output) {
-    const auto recording = _open(path);
+ExitStatus EventsCommand::tell(const PartPaths& parts, Output& output) {
+    if (const auto missing = missingParts(parts)) {
+        _report(*missing);
+    }
+    const auto recording = openParts(parts, _open);
     if (!recording) {
         _report(recording.error().sentence);
         return kExitFailure;
@@ -161,7 +171,7 @@ ExitStatus EventsCommand::tell(const std::string& path, Output& output) {
         return kExitFailure;
     }
     if ((*recording)->technology() == &kSnapshotTechnology) {
-        _report(noTimeOfSnapshot(path).sentence);
+        _report(noTimeOfSnapshot(parts.front()).sentence);
         return kExitFailure;
     }
     return tellEvents(**recording, *technology, output);
@@ -170,7 +180,7 @@ ExitStatus EventsCommand::tell(const std::string& path, Output& output) {
 ExitStatus EventsCommand::tellEvents(Recording& recording, const RecordedTechnology& technology,
                                      Output& output) {
     const bool isWaitedFor = !recording.position();
-    EventLines lines(_options, _zone, recording.name(), output);
+    EventLines lines({_options.json, _areSeveral}, _zone, recording.name(), output);
     const Timeline* index = nullptr;
     PassingJournal journal(recording, [&] {
         lines.writeNew(*index);

@@ -2,6 +2,7 @@
 
 #include "console/ExitStatus.h"
 #include "decoding/DecodeCommand.h"
+#include "host/RecordingParts.h"
 
 #include <functional>
 #include <string>
@@ -22,8 +23,9 @@ struct EventsOptions {
 };
 
 /// Writes a line for each event of the recordings, in the order of the command line: local time,
-/// kind and words, or a JSON object. Those of a pipe are written when they happen. A recording that
-/// cannot be read does not stop the others; a fatal record ends its recording.
+/// kind and words, or a JSON object. The numbered parts of a recording are one. Those of a pipe are
+/// written when they happen. A recording that cannot be read does not stop the others; a fatal
+/// record ends its recording.
 class EventsCommand {
 public:
     /// `zone` tells the local time.
@@ -36,7 +38,7 @@ public:
     ExitStatus run(Output& output);
 
 private:
-    ExitStatus tell(const std::string& path, Output& output);
+    ExitStatus tell(const PartPaths& parts, Output& output);
     ExitStatus tellEvents(Recording& recording, const RecordedTechnology& technology,
                           Output& output);
 
@@ -45,6 +47,7 @@ private:
     DecodeCommand::Open _open;
     DecodeCommand::Report _report;
     const Clock& _zone;
+    bool _areSeveral = false; ///< recordings
 };
 
 /// `EventsCommand`, wired to this machine.

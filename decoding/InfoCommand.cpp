@@ -6,6 +6,7 @@
 #include "decoding/SnapshotText.h"
 #include "decoding/SummaryText.h"
 #include "host/Complaint.h"
+#include "host/JoinedRecording.h"
 #include "host/Snapshot.h"
 #include "host/WallClock.h"
 
@@ -16,22 +17,26 @@ namespace pallax {
 
 ExitStatus InfoCommand::run(Output& output) {
     ExitStatus status = kExitSuccess;
-    for (const std::string& path : _options.files) {
-        const ExitStatus result = describe(path, output);
+    for (const PartPaths& parts : joinedParts(_options.files, _environment.open)) {
+        const ExitStatus result = describe(parts, output);
         status = result == kExitSuccess ? status : result;
         output.flush(); // the next file may have to be waited for
     }
     return status;
 }
 
-ExitStatus InfoCommand::describe(const std::string& path, Output& output) {
-    const Recording::OpenResult recording = _environment.open(path);
+ExitStatus InfoCommand::describe(const PartPaths& parts, Output& output) {
+    if (const auto missing = missingParts(parts)) {
+        _environment.report(*missing);
+    }
+    const Recording::OpenResult recording = openParts(parts, _environment.open);
     if (!recording) {
         _environment.report(recording.error().sentence);
         return kExitFailure;
     }
-    return (*recording)->technology() == &kSnapshotTechnology ? describeSnapshot(path, output)
-                                                              : describe(**recording, output);
+    return (*recording)->technology() == &kSnapshotTechnology
+               ? describeSnapshot(parts.front(), output)
+               : describe(**recording, output);
 }
 
 ExitStatus InfoCommand::describeSnapshot(const std::string& path, Output& output) {

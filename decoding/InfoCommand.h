@@ -3,6 +3,7 @@
 #include "console/ExitStatus.h"
 #include "decoding/RecordingSummary.h"
 #include "host/Recording.h"
+#include "host/RecordingParts.h"
 #include "platform/Clock.h"
 
 #include <functional>
@@ -34,12 +35,13 @@ public:
     InfoCommand(const InfoOptions& options, const Environment& environment)
         : _options(options), _environment(environment) {}
 
-    /// Describes one file after the other; each is written before the next is opened. A file that
-    /// cannot be read further is described up to there.
+    /// Describes one file after the other, the numbered parts of a recording as one; each is
+    /// written before the next is opened. A file that cannot be read further is described up to
+    /// there.
     ExitStatus run(Output& output);
 
 private:
-    ExitStatus describe(const std::string& path, Output& output);
+    ExitStatus describe(const PartPaths& parts, Output& output);
     ExitStatus describe(Recording& recording, Output& output);
     ExitStatus describeSnapshot(const std::string& path, Output& output);
     void separate(Output& output);

@@ -1,7 +1,7 @@
 #include "querying/RecordedTimeline.h"
 
-#include "decoding/JoinedRecording.h"
 #include "host/BoundedJournal.h"
+#include "host/JoinedRecording.h"
 #include "host/RecordingJournal.h"
 #include "host/Snapshot.h"
 #include "text/Format.h"
@@ -23,8 +23,7 @@ struct OpenJournal {
 using OpenResult = Result<OpenJournal, RecordingError>;
 
 Recording::OpenResult openRecordings(const std::vector<std::string>& paths) {
-    return paths.size() == 1 ? Recording::open(paths.front())
-                             : JoinedRecording::open(paths, Recording::open);
+    return openParts(paths, Recording::open);
 }
 
 OpenResult openFile(const std::string& path) {

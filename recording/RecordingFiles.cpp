@@ -1,6 +1,7 @@
 #include "recording/RecordingFiles.h"
 
 #include "host/Recording.h"
+#include "host/RecordingParts.h"
 #include "text/Format.h"
 
 #include <filesystem>
@@ -21,10 +22,11 @@ bool namesFile(const std::string& path) {
            (type == fs::file_type::regular || type == fs::file_type::not_found);
 }
 
-/// The path with `number` before the extension.
-std::string partOf(const std::string& path, const std::string& number) {
+/// The path for another technology, with `number` before the extension: "drive-2.pcapng".
+std::string pathOfTechnology(const std::string& path, unsigned number) {
     const fs::path whole(path);
-    const std::string name = whole.stem().string() + "-" + number + whole.extension().string();
+    const std::string name =
+        whole.stem().string() + formatText("-%u", {number}) + whole.extension().string();
     return (whole.parent_path() / name).string();
 }
 
@@ -37,8 +39,8 @@ Result<std::unique_ptr<RecordingFiles>, HostError> RecordingFiles::open(const Op
             formatText("A recording in several files needs the name of a file, which %@ is not.",
                        {options.path})};
     }
-    auto file = PcapNgWriter::create(
-        options.rotates() ? numberedPath(options.path, 1) : options.path, options.existing);
+    auto file = PcapNgWriter::create(options.rotates() ? partPath(options.path, 1) : options.path,
+                                     options.existing);
     if (!file) {
         return file.error();
     }
@@ -141,12 +143,8 @@ std::optional<HostError> RecordingFiles::nextFile() {
 
 std::string RecordingFiles::nextPath() {
     ++_number;
-    return _options.rotates() ? numberedPath(_options.path, _number)
-                              : partOf(_options.path, std::to_string(_number));
-}
-
-std::string RecordingFiles::numberedPath(const std::string& path, unsigned number) {
-    return partOf(path, formatText("%04u", {number}));
+    return _options.rotates() ? partPath(_options.path, _number)
+                              : pathOfTechnology(_options.path, _number);
 }
 
 } // namespace pallax

@@ -53,9 +53,6 @@ public:
     std::uint64_t bytes() const { return _bytes; } ///< of the packets themselves
     std::uint64_t tooLarge() const { return _tooLarge; }
 
-    /// The name of the file with this number.
-    static std::string numberedPath(const std::string& path, unsigned number);
-
 private:
     RecordingFiles(Options options, Notice notice, std::unique_ptr<PcapNgWriter> file)
         : _options(std::move(options)), _notice(std::move(notice)), _file(std::move(file)) {}

@@ -72,6 +72,37 @@ TEST_F(EventsCommandTest, OfSeveralRecordingsEachLineNamesItsOwnAndOneThatFailsS
                                                  "b.pcap ends in the middle of a packet."}));
 }
 
+TEST_F(EventsCommandTest, TheSecondPartOfARecordingContinuesTheStateOfTheFirst) {
+    add("a-0002.pcap", {cell(31, 182)});
+    add("a-0001.pcap", {cell(0, 150)});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "2023-11-14 22:13:51.000  cell-change       serving cell 150 → 182 after "
+                       "31 s\n");
+    EXPECT_TRUE(reports.empty());
+    options.json = true;
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_TRUE(written.starts_with(R"({"recording":"a-0001.pcap and 1 more",)")) << written;
+    options.json = false;
+    add("a-0004.pcap", {cell(40, 7)});
+    add("other.pcap", {cell(0, 1), cell(9, 2)});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "a-0001.pcap and 2 more: 2023-11-14 22:13:51.000  cell-change       serving "
+                       "cell 150 → 182 after 31 s\n"
+                       "a-0001.pcap and 2 more: 2023-11-14 22:14:00.000  cell-change       serving "
+                       "cell 182 → 7 after 9 s\n"
+                       "other.pcap: 2023-11-14 22:13:29.000  cell-change       serving cell 1 → 2 "
+                       "after 9 s\n");
+    EXPECT_EQ(reports, std::vector<std::string>{"a-0002.pcap and a-0004.pcap are read as one, "
+                                                "without the part between them: a-0003.pcap."});
+}
+
+TEST_F(EventsCommandTest, TheSecondPartAloneBeginsWithoutAState) {
+    add("a-0002.pcap", {cell(31, 182)});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "");
+    EXPECT_TRUE(reports.empty());
+}
+
 TEST_F(EventsCommandTest, AFatalRecordIsTheLastEventOfItsRecording) {
     const std::string unreadable = textOf(Record(0xFF0000).u8(1).bytes());
     add("a.pcap", {cell(0, 1), {seconds(1), unreadable}, cell(2, 2)});

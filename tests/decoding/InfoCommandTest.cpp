@@ -197,5 +197,17 @@ TEST(RecordingSummary, StretchesOfCenturiesAddUpToTheLongestDuration) {
     EXPECT_EQ(summary.duration(), std::chrono::nanoseconds::max());
 }
 
+TEST_F(InfoCommandTest, TheNumberedPartsOfARecordingAreOne) {
+    add("a-0002.pcap", {{seconds(10), idleMeasurement()}, {seconds(11), idleMeasurement()}});
+    add("a-0001.pcap", {{seconds(0), idleMeasurement()}});
+    const auto whole = json();
+    EXPECT_EQ(whole["file"], "a-0001.pcap and 1 more");
+    EXPECT_EQ(whole["packets"], 3);
+    add("a-0004.pcap", {});
+    EXPECT_EQ(json()["file"], "a-0001.pcap and 2 more");
+    EXPECT_EQ(reports, std::vector<std::string>{"a-0002.pcap and a-0004.pcap are read as one, "
+                                                "without the part between them: a-0003.pcap."});
+}
+
 } // namespace
 } // namespace pallax

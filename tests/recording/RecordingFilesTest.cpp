@@ -1,6 +1,7 @@
 #include "recording/RecordingFiles.h"
 
 #include "host/Recording.h"
+#include "host/RecordingParts.h"
 #include "tests/doubles/RuntimeFolder.h"
 
 #include <gtest/gtest.h>
@@ -241,8 +242,7 @@ TEST_F(RecordingFilesTest, NoNumberHasMoreThanFourDigitsSoThatNamesSort) {
     auto options = optionsFor("a.pcapng");
     options.rotateSize = 1;
     for (unsigned number = 2; number < RecordingFiles::kMostParts; ++number) {
-        folder.write(
-            std::filesystem::path(RecordingFiles::numberedPath("a.pcapng", number)).string(), "");
+        folder.write(std::filesystem::path(partPath("a.pcapng", number)).string(), "");
     }
     const auto files = RecordingFiles::open(options);
     ASSERT_EQ(add(**files, seconds(0)), std::nullopt);
@@ -267,12 +267,6 @@ TEST_F(RecordingFilesTest, NumbersNeedTheNameOfAFile) {
                   "A recording in several files needs the name of a file, which " + path +
                       " is not.");
     }
-}
-
-TEST(RecordingFiles, TheNumberStandsBeforeTheExtension) {
-    EXPECT_EQ(RecordingFiles::numberedPath("/x.y/drive.pcapng", 7), "/x.y/drive-0007.pcapng");
-    EXPECT_EQ(RecordingFiles::numberedPath("drive", 12345), "drive-12345");
-    EXPECT_EQ(RecordingFiles::numberedPath("a/b.c.d", 1), "a/b.c-0001.d");
 }
 
 } // namespace

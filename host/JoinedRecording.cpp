@@ -1,4 +1,4 @@
-#include "decoding/JoinedRecording.h"
+#include "host/JoinedRecording.h"
 
 #include "text/Format.h"
 

@@ -49,4 +49,10 @@ private:
     std::optional<RecordingError> _error;  ///< the same, at the end
 };
 
+/// One recording as it is, several as one.
+inline Recording::OpenResult openParts(const std::vector<std::string>& paths,
+                                       const JoinedRecording::Open& open) {
+    return paths.size() == 1 ? open(paths.front()) : JoinedRecording::open(paths, open);
+}
+
 } // namespace pallax
