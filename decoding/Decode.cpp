@@ -193,6 +193,10 @@ ExitStatus runDecode(const DecodeOptions& options) {
         complain(*loss);
         return kExitFailure;
     }
+    if (options.window.areReversed(localZone)) {
+        complain("The time of --from is later than that of --to.");
+        return kExitWrongUsage;
+    }
     if (!options.select.empty()) {
         const RequiredTemplates resources(DirectoryResources::programFolder());
         if (const auto name = FieldSelection::unknownName(options.select, resources)) {

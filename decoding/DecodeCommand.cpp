@@ -243,7 +243,8 @@ DecodeCommand::conditioned(const Recording& recording, const RecordedTechnology&
 }
 
 std::optional<TimeSpan> DecodeCommand::spanBefore(const Recording& recording) const {
-    if (!_options.chosenWindow().needEnd() || recording.isStream()) {
+    const DecodeWindow::Texts window = _options.chosenWindow();
+    if ((!window.to && !window.needEnd()) || recording.isStream()) {
         return std::nullopt;
     }
     const auto again = openWhole(_place);

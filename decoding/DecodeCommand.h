@@ -112,7 +112,8 @@ private:
     Result<std::unique_ptr<ConditionedOutput>, ExitStatus>
     conditioned(const Recording& recording, const RecordedTechnology& technology,
                 DisplayOutput& displays);
-    /// The span of a recording whose end matters; nothing if it is not needed or not to be known.
+    /// The span of a recording whose end or stretches matter; nothing if it is not needed or not to
+    /// be known.
     std::optional<TimeSpan> spanBefore(const Recording& recording) const;
     Recording::OpenResult openWhole(std::size_t place) const;
     ExitStatus decodePackets(Recording& recording, RecordingDecoder& decoder, DecodeWindow& window,

@@ -1,16 +1,19 @@
 #pragma once
 
 #include "decoding/DisplayOutput.h"
+#include "packets/StampSequence.h"
 #include "text/TimeText.h"
 
+#include <cstddef>
 #include <optional>
 #include <string>
 
 namespace pallax {
 
 /// The part of a recording whose displays are wanted: between two times, either of which may be
-/// missing. The recording is over at the first packet after `to` that follows an earlier one, so
-/// where a clock was set back, the first stretch with that time is meant.
+/// missing. Where a clock was set back, `to` lies in the first stretch that has it or else in the
+/// one that ends latest before it, as for `Timeline::instantAt`. The stretches of a stream are not
+/// known: it is over at the first packet after `to` that follows an earlier one.
 class DecodeWindow {
 public:
     struct Texts {
@@ -20,6 +23,8 @@ public:
         bool areEmpty() const { return !from && !to; }
         /// Whether the times depend on the end of the recording.
         bool needEnd() const { return (from && from->needsEnd()) || (to && to->needsEnd()); }
+        /// Whether they are in the wrong order in every recording.
+        bool areReversed(const ZoneRule& zone) const;
     };
 
     explicit DecodeWindow(Texts texts) : _texts(std::move(texts)), _isOpen(_texts.areEmpty()) {}
@@ -38,10 +43,15 @@ public:
 
 private:
     Texts _texts;
+    bool isOverInStretch(Time packet);
+
     Time _from = kEarliestTime;
     Time _to = Time::max();
     bool _isOpen;
     bool _hasBegun = false;
+    std::optional<std::size_t> _lastStretch; ///< that of `to`, from 0; nothing if not known
+    StampSequence _stamps;
+    std::size_t _stretch = 0; ///< of the latest packet
 };
 
 /// Passes on the displays of ticks and packets in a window, and the display at the end.

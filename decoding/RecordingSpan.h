@@ -5,7 +5,8 @@
 
 namespace pallax {
 
-/// Reads the recording to its end: from its first stamp to its latest. Nothing without packets.
+/// Reads the recording to its end: from its first stamp to its latest, and its stretches. Nothing
+/// without packets.
 std::optional<TimeSpan> spanOf(Recording& recording);
 
 } // namespace pallax

@@ -190,15 +190,21 @@ nanoseconds TimeTextParser::distance() {
     seconds whole{0};
     nanoseconds rest{0};
     do {
+        if (digitsHere() > kMostDistanceDigits) {
+            fail("numbers have at most 9 digits");
+            return {};
+        }
         const std::int64_t value = number(1, kMostDistanceDigits, "a number");
+        const std::size_t placeOfFraction = _at;
         const bool hasFraction = isAt('.');
         rest = fraction();
         const std::size_t place = _at;
         const auto* unit =
             std::find_if(next, kUnits.end(), [this](const Unit& each) { return take(each.name); });
         if (unit == kUnits.end() || (hasFraction && unit->name != 's')) {
-            failAt(place, hasFraction ? "expected the unit s"
-                                      : "expected the unit h, m or s, in this order");
+            failAt(hasFraction ? placeOfFraction : place,
+                   hasFraction ? "only seconds have a fraction"
+                               : "expected the unit h, m or s, in this order");
             return {};
         }
         next = unit + 1;
@@ -293,26 +299,37 @@ Result<Time, TimeTextError> TimeText::timeIn(const TimeSpan& span, const ZoneRul
 }
 
 Result<Time, TimeTextError> TimeText::clockIn(const TimeSpan& span, const ZoneRule& zone) const {
-    const Time end = span.end.value_or(kLatestTime);
-    const auto today =
-        std::chrono::floor<std::chrono::days>(span.begin + zone(span.begin)).time_since_epoch();
+    TimeSpan::Stretch whole{span.begin, span.end.value_or(kLatestTime)};
+    for (const TimeSpan::Stretch& stretch : span.stretches) {
+        if (const auto time = firstIn(stretch, zone)) {
+            return *time;
+        }
+        whole.begin = std::min(whole.begin, stretch.begin);
+    }
+    if (const auto time = firstIn(whole, zone)) { // between stretches
+        return *time;
+    }
+    const auto local = [&zone](Time time) { return localDateText(time, zone(time)); };
+    return TimeTextError{formatText("\"%@\" is no time of the recording, which lasts from %@ "
+                                    "to %@.",
+                                    {_text, local(whole.begin), local(whole.end)}),
+                         0};
+}
+
+std::optional<Time> TimeText::firstIn(const TimeSpan::Stretch& stretch,
+                                      const ZoneRule& zone) const {
+    const auto today = std::chrono::floor<std::chrono::days>(stretch.begin + zone(stretch.begin))
+                           .time_since_epoch();
     std::optional<Time> first;
     // Each day has the time, so the first that fits is near, or none does.
     for (int day = -1; day <= 2; ++day) {
         for (const Time time : timesOfLocal(today + std::chrono::days(day) + _size, zone)) {
-            if (time >= span.begin && time <= end && (!first || time < *first)) {
+            if (time >= stretch.begin && time <= stretch.end && (!first || time < *first)) {
                 first = time;
             }
         }
     }
-    if (!first) {
-        const auto local = [&zone](Time time) { return localDateText(time, zone(time)); };
-        return TimeTextError{formatText("\"%@\" is no time of the recording, which lasts from %@ "
-                                        "to %@.",
-                                        {_text, local(span.begin), local(end)}),
-                             0};
-    }
-    return *first;
+    return first;
 }
 
 } // namespace pallax

@@ -9,20 +9,29 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 /// Times as people write them on a command line:
 ///
 ///   start, end                 of the recording
 ///   +90s, +1h30m               after its start; -5m, before its end
-///   14:03, 14:03:20.5          local time, the first that lies in the recording
+///   14:03, 14:03:20.5          local time, the first that lies in the recording or, where its
+///                              clock was set back, in the first stretch that has it
 ///   2023-11-14T14:03:20.5      local time; also with a blank in place of the T, or the date alone
 ///   2023-11-14T14:03Z, …+0200  with a zone
 namespace pallax {
 
-/// What a recording's times lie between, both within kEarliestTime to kLatestTime.
+/// What a recording's times lie between, all within kEarliestTime to kLatestTime.
 struct TimeSpan {
-    Time begin;
-    std::optional<Time> end; ///< nothing while it is not known, as for a pipe
+    /// A part in which the clock was not set back.
+    struct Stretch {
+        Time begin;
+        Time end;
+    };
+
+    Time begin;                          ///< of the first packet
+    std::optional<Time> end;             ///< the latest; nothing while not known, as for a pipe
+    std::vector<Stretch> stretches = {}; ///< in their order; may be empty if there is only one
 };
 
 /// Local time minus UTC, at a time.
@@ -44,6 +53,10 @@ public:
     /// or has twice is the first that the clock can have meant.
     Result<Time, TimeTextError> timeIn(const TimeSpan& span, const ZoneRule& zone) const;
 
+    /// Whether it is the same time in every recording.
+    bool isAbsolute() const { return _kind == Kind::Local || _kind == Kind::Utc; }
+    /// Whether it is the end of the recording.
+    bool isEnd() const { return _kind == Kind::BeforeEnd && _size.count() == 0; }
     /// Whether `timeIn` depends on the end of the recording.
     bool needsEnd() const { return _kind == Kind::BeforeEnd || _kind == Kind::Clock; }
 
@@ -51,6 +64,7 @@ private:
     friend class TimeTextParser;
     enum class Kind { AfterStart, BeforeEnd, Clock, Local, Utc };
     Result<Time, TimeTextError> clockIn(const TimeSpan& span, const ZoneRule& zone) const;
+    std::optional<Time> firstIn(const TimeSpan::Stretch& stretch, const ZoneRule& zone) const;
 
     std::string _text;
     Kind _kind = Kind::AfterStart;

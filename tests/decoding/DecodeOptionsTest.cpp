@@ -104,6 +104,59 @@ TEST_F(DecodeOptionsTest, WhereTheClockWasSetBackTheFirstStretchIsMeant) {
     EXPECT_EQ(shown(), "2");
 }
 
+TEST_F(DecodeOptionsTest, ATimeThatNoStretchHasIsInTheOneThatEndsLatestBeforeIt) {
+    add("a.pcap", {{milliseconds(50'000), "A=1"},
+                   {milliseconds(60'000), "A=2"},
+                   {milliseconds(0), "A=3"},
+                   {milliseconds(10'000), "A=4"}});
+    options.at = time("2023-11-14T22:14:30Z"); // 70 s
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(shown(), "2");
+    options.at = time("2023-11-14T22:13:50Z"); // 30 s
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(shown(), "4");
+    options.at = time("end");
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(shown(), "4");
+    options.at = time("2023-11-14T22:13:19Z");
+    EXPECT_EQ(run(), kExitFailure);
+}
+
+TEST_F(DecodeOptionsTest, AClockTimeMayLieInAStretchBeforeTheFirstPacket) {
+    add("a.pcap",
+        {{milliseconds(100'000), "A=1"}, {milliseconds(0), "A=2"}, {milliseconds(5000), "A=3"}});
+    options.at = time("23:13:22");
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(shown(), "2");
+    options.at = time("23:13:40"); // between the stretches
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(shown(), "3");
+    options.at = time("23:13:19");
+    EXPECT_EQ(run(), kExitFailure);
+    EXPECT_EQ(reports,
+              std::vector<std::string>{
+                  "a.pcap: \"23:13:19\" is no time of the recording, which lasts from 2023-11-14 "
+                  "23:13:20 to 2023-11-14 23:15:00."});
+}
+
+TEST_F(DecodeOptionsTest, FromAfterToIsAnError) {
+    add("a.pcap", fivePackets());
+    options.every = Every::Packet;
+    options.window = {time("+3s"), time("+2s")};
+    EXPECT_EQ(run(), kExitFailure);
+    EXPECT_EQ(written, "");
+    EXPECT_EQ(reports,
+              std::vector<std::string>{"a.pcap: the time of --from is later than that of --to."});
+    const auto areReversed = [](const char* from, const char* to) {
+        return DecodeWindow::Texts{time(from), time(to)}.areReversed([](Time) { return kEast; });
+    };
+    EXPECT_TRUE(areReversed("2023-11-14T22:13:22Z", "2023-11-14T22:13:21Z"));
+    EXPECT_TRUE(areReversed("2023-11-14 23:13:22", "2023-11-14T22:13:21Z"));
+    EXPECT_FALSE(areReversed("2023-11-14 22:13:22", "2023-11-14T22:13:21Z"));
+    EXPECT_FALSE(areReversed("2023-11-14T22:13:21Z", "2023-11-14T22:13:21Z"));
+    EXPECT_FALSE(areReversed("+3s", "+2s"));
+}
+
 TEST_F(DecodeOptionsTest, AClockTimeThatIsNotInTheRecordingIsAnError) {
     add("a.pcap", fivePackets());
     options.at = time("14:03");

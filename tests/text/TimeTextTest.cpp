@@ -53,6 +53,18 @@ TEST_F(TimeTextTest, StartAndEndAndDistancesFromThem) {
     EXPECT_EQ(timeOf("+0s"), "2023-11-14T22:10:00.000Z");
 }
 
+TEST_F(TimeTextTest, AClockTimeIsThatOfTheFirstStretchThatHasIt) {
+    span = {at("2023-11-15T02:00:00Z"),
+            at("2023-11-15T09:00:00Z"),
+            {{at("2023-11-15T02:00:00Z"), at("2023-11-15T03:00:00Z")},
+             {at("2023-11-13T01:00:00Z"), at("2023-11-13T04:00:00Z")},
+             {at("2023-11-15T08:00:00Z"), at("2023-11-15T09:00:00Z")}}};
+    EXPECT_EQ(timeOf("00:30"), "2023-11-15T02:30:00.000Z"); // also in the second
+    EXPECT_EQ(timeOf("01:30"), "2023-11-13T03:30:00.000Z");
+    EXPECT_EQ(timeOf("06:30"), "2023-11-15T08:30:00.000Z");
+    EXPECT_EQ(timeOf("12:00"), "2023-11-13T14:00:00.000Z"); // in none
+}
+
 TEST_F(TimeTextTest, DistancesStayInTheRangeOfRecordings) {
     EXPECT_EQ(timeOf("+999999999h"), isoTimeText(kLatestTime));
     EXPECT_EQ(timeOf("-999999999h999999999m999999999.999999999s"), isoTimeText(kEarliestTime));
@@ -111,7 +123,10 @@ TEST_F(TimeTextTest, AnErrorNamesThePlace) {
         "3: \"+90\" is not a time: expected the unit h, m or s, in this order (character 4).");
     EXPECT_EQ(timeOf("+1m1h"), "4: \"+1m1h\" is not a time: expected the unit h, m or s, in this "
                                "order (character 5).");
-    EXPECT_EQ(timeOf("-1.5m"), "4: \"-1.5m\" is not a time: expected the unit s (character 5).");
+    EXPECT_EQ(timeOf("-1.5m"),
+              "2: \"-1.5m\" is not a time: only seconds have a fraction (character 3).");
+    EXPECT_EQ(timeOf("+1h9999999999s"), "3: \"+1h9999999999s\" is not a time: numbers have at most "
+                                        "9 digits (character 4).");
     EXPECT_EQ(timeOf("+"), "1: \"+\" is not a time: expected a number (character 2).");
     EXPECT_EQ(timeOf("start "), "0: \"start \" is not a time: expected 14:03, 2023-11-14T14:03, "
                                 "+90s, -5m, start or end (character 1).");
