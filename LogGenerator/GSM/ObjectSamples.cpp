@@ -1,8 +1,6 @@
 #include "LogGenerator/GSM/ObjectSamples.h"
 
 #include <algorithm>
-#include <charconv>
-#include <optional>
 #include <utility>
 
 namespace pallax {
@@ -10,43 +8,6 @@ namespace pallax {
 namespace {
 
 constexpr std::string_view kAnyEntry = "*";
-
-bool isDigit(char character) {
-    return character >= '0' && character <= '9';
-}
-
-/// The unit in the text after a number: one word after a blank, or a per cent sign. Nothing for
-/// other texts.
-std::optional<std::string_view> unitIn(std::string_view rest) {
-    if (rest.empty() || rest == "%") {
-        return rest;
-    }
-    if (rest.size() < 2 || rest.front() != ' ' || isDigit(rest[1]) ||
-        rest.find_first_of(" +-,;:()", 1) != std::string_view::npos) {
-        return std::nullopt;
-    }
-    return rest.substr(1);
-}
-
-/// The number in a text, with its unit if it has one; nothing for other texts.
-std::optional<NumberText> numberIn(std::string_view text) {
-    const std::size_t sign = !text.empty() && (text[0] == '-' || text[0] == '+') ? 1 : 0;
-    if (text.size() == sign || !isDigit(text[sign])) {
-        return std::nullopt; // from_chars also takes "inf" and "nan"
-    }
-    const char* const start = text.data() + sign;
-    const char* const end = text.data() + text.size();
-    double number = 0.0;
-    const auto read = std::from_chars(start, end, number, std::chars_format::fixed);
-    if (read.ec != std::errc()) {
-        return std::nullopt;
-    }
-    const auto unit = unitIn({read.ptr, static_cast<std::size_t>(end - read.ptr)});
-    if (!unit) {
-        return std::nullopt;
-    }
-    return NumberText{text, text[0] == '-' ? -number : number, *unit};
-}
 
 } // namespace
 
@@ -93,7 +54,7 @@ void ObjectSamples::giveText(std::string_view text) {
     if (id == kNoField) {
         return;
     }
-    const auto number = numberIn(text);
+    const auto number = numberTextIn(text);
     _sink->sample({id, _fields[id], std::nullopt,
                    number ? SampleValue::text(*number) : SampleValue::text(text)});
 }

@@ -3,6 +3,7 @@
 #include "plist/PropertyList.h"
 #include "text/NumberFormat.h"
 
+#include <optional>
 #include <string_view>
 #include <variant>
 
@@ -14,6 +15,9 @@ struct NumberText {
     double number;
     std::string_view unit; ///< part of the text; may be empty
 };
+
+/// The number in a text, with its unit if it has one; nothing for other texts.
+std::optional<NumberText> numberTextIn(std::string_view text);
 
 /// The value of a field: a number with its format, a label from a table, a text, or an object of a
 /// property list. Texts and objects that are not from a table are valid until the sample is taken.
