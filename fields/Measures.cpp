@@ -11,6 +11,8 @@ namespace {
 // a sign (gsm.gsm_serving_cell.rssi), or sometimes in dBm and sometimes not
 // (gsm.neighboring_cells.rssi), and the measurements of UTRA TDD.
 constexpr auto kFields = std::to_array<MeasuredField>({
+    {"ifx.serving_cell.rx_level", Measure::RxLev},
+    {"ifx.neighbour_cells.rx_level", Measure::RxLev},
     {"gsm.gsm_set.rssi", Measure::RxLev},
     {"gsm.active_set.rscp", Measure::Rscp},
     {"gsm.active_set.energy_per_chip", Measure::EcNo},
