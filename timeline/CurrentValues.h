@@ -60,6 +60,8 @@ public:
         return field < _values.size() && !_values[field].isEmpty() ? &_values[field] : nullptr;
     }
     const FieldValue* value(std::string_view fieldName) const;
+    const FieldTable& fields() const { return *_fields; }
+    const EntryTable& entries() const { return *_entries; }
     std::size_t fieldCount() const { return _values.size(); }
     /// Calls `visit` with each entry (EntryValues) of each list, in the order of the lists.
     template <class Visit>

@@ -43,15 +43,14 @@ std::string joined(const std::vector<std::string>& texts) {
     return all;
 }
 
-/// The access point, if the object has one.
-std::string nameOf(const PropertyList& context) {
+} // namespace
+
+std::string contextName(const PropertyList& context) {
     const DictionaryRef keys = context.dictionary();
     const PropertyList* name = keys != nullptr ? keys->find("APN") : nullptr;
     const auto text = name != nullptr ? name->string() : std::nullopt;
     return text ? *text : context.string().value_or(context.description());
 }
-
-} // namespace
 
 EventFinder::EventFinder(std::string_view technology, const FieldTable& fields, EntryTable& entries,
                          std::chrono::nanoseconds pingPong)
@@ -196,7 +195,7 @@ void EventFinder::lookAtContexts(Row& row, const Moment& moment) {
     moment.values.forEachEntry([&](const EntryValues& entry) {
         for (const auto& [field, value] : entry.values) {
             if (field == row.fields.front()) {
-                names.push_back(nameOf(value.shown));
+                names.push_back(contextName(value.shown));
                 isRead = true;
             }
         }

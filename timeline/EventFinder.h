@@ -13,6 +13,9 @@
 
 namespace pallax {
 
+/// The access point of a packet data context, if the object has one.
+std::string contextName(const PropertyList& context);
+
 /// Finds the events of a recording in its values, packet by packet.
 class EventFinder {
 public:

@@ -35,6 +35,11 @@ std::optional<FieldIndex> FieldTable::named(std::string_view name) const {
     return found != _byName.end() ? std::optional(found->second) : std::nullopt;
 }
 
+std::optional<FieldIndex> FieldTable::atPath(std::string_view path) const {
+    const auto found = _byPath.find(std::string(path));
+    return found != _byPath.end() ? std::optional(found->second) : std::nullopt;
+}
+
 std::span<const FieldIndex> FieldTable::underKey(std::string_view section,
                                                  std::string_view key) const {
     if (_isObjectStream) {

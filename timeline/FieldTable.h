@@ -34,6 +34,9 @@ public:
     const FieldInfo& operator[](FieldIndex index) const { return _fields[index]; }
     std::size_t size() const { return _fields.size(); }
     std::optional<FieldIndex> named(std::string_view name) const;
+    std::optional<FieldIndex> atPath(std::string_view path) const;
+    /// Its name on the command line.
+    const std::string& technology() const { return _technology; }
 
     /// Whether messages have paths instead of numbered rows.
     bool isObjectStream() const { return _isObjectStream; }

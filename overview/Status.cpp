@@ -1,0 +1,359 @@
+#include "overview/Status.h"
+
+#include "fields/EventFields.h"
+#include "fields/Measures.h"
+#include "fields/StatusFields.h"
+#include "knowledge/CellIdentity.h"
+#include "knowledge/CountryCodes.h"
+#include "text/Format.h"
+#include "timeline/EventFinder.h"
+
+#include <algorithm>
+#include <cmath>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+using Role = StatusField::Role;
+
+/// Whether the value names something: "Not Present" and "N/A" do not.
+bool tells(const FieldValue& value) {
+    return value.text().find_first_of("0123456789") != std::string::npos;
+}
+
+/// "367" of "367 × 64chips", whose text alone a snapshot has.
+std::string identityText(const FieldValue& value) {
+    const std::string text = value.text();
+    const std::size_t blank = text.find(' ');
+    const bool startsWithNumber = text.find_first_not_of("0123456789") == blank;
+    return startsWithNumber ? text.substr(0, blank) : text;
+}
+
+std::string trimmed(std::string text) {
+    text.erase(text.find_last_not_of(' ') + 1);
+    return text;
+}
+
+std::optional<std::uint32_t> wholeNumber(const FieldValue& value) {
+    constexpr double kMost = 4294967295.0;
+    const bool isWhole =
+        value.number >= 0 && value.number <= kMost && value.number == std::trunc(value.number);
+    return isWhole ? std::optional(static_cast<std::uint32_t>(value.number)) : std::nullopt;
+}
+
+std::string siteOf(RadioSystem system, const FieldValue& identity) {
+    const auto number = wholeNumber(identity);
+    const bool isUmts = system == RadioSystem::UmtsFdd || system == RadioSystem::UtraTdd;
+    if (const auto cell = number && system == RadioSystem::Lte ? lteCell(*number) : std::nullopt) {
+        return formatText("eNodeB %u sector %u", {cell->eNodeB, cell->sector});
+    }
+    if (const auto cell = number && isUmts ? umtsCell(*number) : std::nullopt) {
+        return formatText("RNC %u cell %u", {cell->rnc, cell->cell});
+    }
+    return "cell " + identityText(identity);
+}
+
+/// "0" of "800 MHz cellular band [0]".
+std::string bandNumber(const std::string& text) {
+    const std::size_t open = text.rfind('[');
+    return open != std::string::npos && text.ends_with(']')
+               ? text.substr(open + 1, text.size() - open - 2)
+               : text;
+}
+
+/// One gathering.
+class Gathering {
+public:
+    Gathering(const CurrentValues& values, Time time, const QualityProfile& profile)
+        : _values(values), _fields(values.fields()), _profile(profile) {
+        _status.time = time;
+        _status.profile = profile.name;
+    }
+
+    Status status(const NetworkNames& names) {
+        for (const StatusCellFields& rule : statusCells()) {
+            if (rule.technology == _fields.technology()) {
+                addCell(rule);
+            }
+        }
+        const auto isOld = [this](const StatusNeighbour& neighbour) {
+            return _status.time - neighbour.level.read > kFresh;
+        };
+        std::stable_sort(_status.neighbours.begin(), _status.neighbours.end(),
+                         [&](const StatusNeighbour& one, const StatusNeighbour& other) {
+                             return isOld(one) != isOld(other)
+                                        ? isOld(other)
+                                        : one.level.number > other.level.number;
+                         });
+        addStatesAndContexts();
+        addNetwork(names);
+        return std::move(_status);
+    }
+
+private:
+    StatusValue valueOf(std::string_view name, std::string_view field, const FieldValue& value) {
+        return {std::string(name), std::string(field), value.text(), value.number, {}, value.read};
+    }
+    StatusValue identityOf(const StatusField& field, const FieldValue& value) {
+        StatusValue identity = valueOf(field.name, field.field, value);
+        identity.text = identityText(value);
+        return identity;
+    }
+    StatusValue levelOf(std::string_view name, std::string_view field, const FieldValue& value) {
+        StatusValue level = valueOf(name, field, value);
+        level.grade =
+            std::isfinite(value.number) ? qualityOf(_profile, field, value.number) : std::nullopt;
+        return level;
+    }
+    const FieldValue* find(std::string_view field) const {
+        const FieldValue* value = field.empty() ? nullptr : _values.value(field);
+        return value != nullptr && tells(*value) ? value : nullptr;
+    }
+
+    void addCell(const StatusCellFields& rule);
+    static void addLevel(StatusCell& cell, StatusValue level);
+    void addChannel(StatusCell& cell, const StatusCellFields& rule, const FieldValue* band) const;
+    void addList(StatusCell& cell, const StatusCellFields& rule, const StatusList& list);
+    /// The values of an entry, as "PCI" and "252".
+    std::vector<std::pair<std::string, std::string>> namesOf(const StatusList& list,
+                                                             const EntryValues& entry) const;
+    void addNeighbour(StatusNeighbour neighbour);
+    void addStatesAndContexts();
+    void addNetwork(const NetworkNames& names);
+
+    const CurrentValues& _values;
+    const FieldTable& _fields;
+    const QualityProfile& _profile;
+    Status _status;
+};
+
+bool isNamed(const std::vector<StatusValue>& values, std::string_view name) {
+    return std::any_of(values.begin(), values.end(),
+                       [name](const StatusValue& value) { return value.name == name; });
+}
+
+void Gathering::addCell(const StatusCellFields& rule) {
+    StatusCell cell;
+    cell.system = rule.name;
+    const FieldValue* band = nullptr;
+    for (const StatusField& field : rule.fields) {
+        const FieldValue* value = find(field.field);
+        if (value == nullptr) {
+            continue;
+        }
+        switch (field.role) {
+        case Role::Site:
+        case Role::Identity:
+            if (!isNamed(cell.identity, field.name)) {
+                cell.site = field.role == Role::Site ? siteOf(rule.system, *value) : cell.site;
+                cell.identity.push_back(identityOf(field, *value));
+            }
+            break;
+        case Role::Channel:
+            if (!cell.channel) {
+                cell.channel = identityOf(field, *value);
+            }
+            break;
+        case Role::Band:
+            band = value;
+            break;
+        case Role::Level:
+            addLevel(cell, levelOf(field.name, field.field, *value));
+            break;
+        }
+    }
+    addChannel(cell, rule, band);
+    for (const StatusList& list : rule.lists) {
+        addList(cell, rule, list);
+    }
+    if (!cell.identity.empty() || cell.channel || !cell.levels.empty()) {
+        _status.cells.push_back(std::move(cell));
+    }
+}
+
+/// Of levels with the same name, the one that was read last counts.
+void Gathering::addLevel(StatusCell& cell, StatusValue level) {
+    const auto same =
+        std::find_if(cell.levels.begin(), cell.levels.end(),
+                     [&level](const StatusValue& other) { return other.name == level.name; });
+    if (same == cell.levels.end()) {
+        cell.levels.push_back(std::move(level));
+    } else if (same->read < level.read) {
+        *same = std::move(level);
+    }
+}
+
+void Gathering::addChannel(StatusCell& cell, const StatusCellFields& rule,
+                           const FieldValue* band) const {
+    const auto number =
+        cell.channel && std::isfinite(cell.channel->number) && cell.channel->number >= 0
+            ? std::optional(static_cast<std::uint32_t>(cell.channel->number))
+            : std::nullopt;
+    if (!number) {
+        return;
+    }
+    cell.band = bandText(rule.system, *number);
+    cell.megahertz = megahertz(rule.system, *number);
+    if (band == nullptr) {
+        return;
+    }
+    cell.band = bandNumber(band->text());
+    for (const Carrier& carrier : carriersOf(rule.system, *number)) {
+        if (carrier.band == cell.band && carrier.downlink) {
+            constexpr double kHertz = 1e6;
+            cell.megahertz = static_cast<double>(carrier.downlink->hertz) / kHertz;
+            return;
+        }
+    }
+}
+
+std::vector<std::pair<std::string, std::string>>
+Gathering::namesOf(const StatusList& list, const EntryValues& entry) const {
+    std::vector<std::pair<std::string, std::string>> names;
+    if (list.identity.empty()) {
+        const std::string& words = _values.entries().words(entry.entry); // "PN 117"
+        const std::size_t blank = words.find(' ');
+        names.emplace_back(words.substr(0, blank),
+                           words.substr(std::min(blank, words.size() - 1) + 1));
+        return names;
+    }
+    for (const StatusField& part : list.identity) {
+        for (const auto& [field, value] : entry.values) {
+            if (_fields[field].name == part.field && tells(value)) {
+                names.emplace_back(part.name, identityText(value));
+            }
+        }
+    }
+    return names;
+}
+
+/// Whether the cell has the same values under these names. It must have the first; any other that
+/// it lacks does not count.
+bool isSame(const StatusCell& cell, const std::vector<std::pair<std::string, std::string>>& names) {
+    bool hasFirst = false;
+    for (const auto& [name, text] : names) {
+        const auto isPart = [&name = name](const StatusValue& part) { return part.name == name; };
+        const auto part = std::find_if(cell.identity.begin(), cell.identity.end(), isPart);
+        const StatusValue* own = part != cell.identity.end() ? &*part : nullptr;
+        own = own == nullptr && cell.channel && isPart(*cell.channel) ? &*cell.channel : own;
+        if (own != nullptr && own->text != text) {
+            return false;
+        }
+        hasFirst = hasFirst || (own != nullptr && &name == &names.front().first);
+    }
+    return hasFirst;
+}
+
+void Gathering::addList(StatusCell& cell, const StatusCellFields& rule, const StatusList& list) {
+    const auto level = _fields.named(list.level);
+    if (!level) {
+        return;
+    }
+    _values.forEachEntry([&](const EntryValues& entry) {
+        for (const auto& [field, value] : entry.values) {
+            if (field != *level || !tells(value)) {
+                continue;
+            }
+            const auto names = namesOf(list, entry);
+            const bool isServing = list.servingMark.empty()
+                                       ? isSame(cell, names)
+                                       : value.text().starts_with(list.servingMark);
+            StatusValue measured = levelOf(list.levelName, list.level, value);
+            if (isServing) {
+                const std::size_t mark = list.servingMark.size();
+                measured.text.erase(0, mark + (mark > 0 ? 1 : 0)); // and its blank
+                addLevel(cell, std::move(measured));
+                continue;
+            }
+            std::string words;
+            for (const auto& [name, text] : names) {
+                words.append(words.empty() ? "" : " ").append(name).append(" ").append(text);
+            }
+            addNeighbour({std::string(rule.name), std::move(words), std::move(measured)});
+        }
+    });
+}
+
+/// Of a cell that is in several lists, the latest level counts.
+void Gathering::addNeighbour(StatusNeighbour neighbour) {
+    const auto same = std::find_if(
+        _status.neighbours.begin(), _status.neighbours.end(), [&](const StatusNeighbour& other) {
+            return other.system == neighbour.system && other.cell == neighbour.cell;
+        });
+    if (same == _status.neighbours.end()) {
+        _status.neighbours.push_back(std::move(neighbour));
+    } else if (same->level.read < neighbour.level.read) {
+        *same = std::move(neighbour);
+    }
+}
+
+void Gathering::addStatesAndContexts() {
+    for (const EventFields& rule : eventFields()) {
+        if (rule.technology != _fields.technology()) {
+            continue;
+        }
+        const std::string_view name = rule.fields.front();
+        const FieldValue* value = _values.value(name);
+        if (rule.watch == EventFields::Watch::State && value != nullptr) {
+            _status.states.push_back(valueOf(rule.subject, name, *value));
+        } else if (rule.watch == EventFields::Watch::Contexts) {
+            _values.forEachEntry([&](const EntryValues& entry) {
+                for (const auto& [field, held] : entry.values) {
+                    if (_fields[field].name == name) {
+                        const DictionaryRef keys = held.shown.dictionary();
+                        const PropertyList* state = keys ? keys->find("State") : nullptr;
+                        _status.contexts.push_back(
+                            {contextName(held.shown),
+                             state != nullptr ? state->string().value_or("") : ""});
+                    }
+                }
+            });
+        }
+    }
+}
+
+void Gathering::addNetwork(const NetworkNames& names) {
+    const auto rule =
+        std::find_if(statusNetworks().begin(), statusNetworks().end(),
+                     [this](const auto& each) { return each.technology == _fields.technology(); });
+    if (rule == statusNetworks().end()) {
+        return;
+    }
+    const auto textOf = [this](std::string_view field) {
+        const FieldValue* value = field.empty() ? nullptr : _values.value(field);
+        return value != nullptr ? trimmed(value->text()) : std::string();
+    };
+    StatusOperator network;
+    const auto home = NetworkCode::in(textOf(rule->simNetwork));
+    network.code = NetworkCode::in(textOf(rule->mcc) + " " + textOf(rule->mnc));
+    if (!network.code) {
+        network.code = home;
+        network.isHome = rule->mcc.empty() && home;
+    }
+    const std::string given = textOf(rule->name);
+    const std::string stored = network.code == home ? textOf(rule->simName) : std::string();
+    const NetworkCode code = network.code.value_or(NetworkCode());
+    const auto operators = names.operatorsOf(code, {given, stored});
+    if (!operators.empty()) {
+        network.name = operators.front().name;
+        network.source = operators.front().source;
+    }
+    const auto countries = countryCodesOf(code.mcc);
+    if (!countries.empty()) {
+        network.country = names.countryName(countries.front());
+    }
+    if (network.code || !network.name.empty()) {
+        _status.network = std::move(network);
+    }
+}
+
+} // namespace
+
+Status statusOf(const CurrentValues& values, Time time, const NetworkNames& names,
+                const QualityProfile& profile) {
+    return Gathering(values, time, profile).status(names);
+}
+
+} // namespace pallax
