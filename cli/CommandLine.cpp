@@ -97,6 +97,7 @@ CommandLine::CommandLine()
     addInfo(addCommand("info", "Tell what recordings hold"), _info);
     addSnapshot(addCommand("snapshot", "Write a part of a saved snapshot"), _snapshot);
     addSql(addCommand("sql", "Ask a recording in SQL"), _sql);
+    addStatus(addCommand("status", "Show the radio in a few lines"), _status);
     addTexts();
 }
 
@@ -212,6 +213,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("sql")) {
         return _sql;
+    }
+    if (_app->got_subcommand("status")) {
+        return _status;
     }
     if (_app->got_subcommand("snapshot")) {
         return _snapshot;

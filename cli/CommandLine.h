@@ -41,6 +41,7 @@ private:
     FieldsOptions _fields;
     InfoOptions _info;
     SqlOptions _sql;
+    StatusOptions _status;
     SnapshotOptions _snapshot;
     RecordOptions _record;
     ServiceRequest _service;

@@ -9,10 +9,12 @@ namespace pallax {
 struct InfoOptions;
 struct SnapshotOptions;
 struct SqlOptions;
+struct StatusOptions;
 
 /// The options of the commands that look into files. They must outlive the app.
 void addInfo(CLI::App& app, InfoOptions& options);
 void addSnapshot(CLI::App& app, SnapshotOptions& options);
 void addSql(CLI::App& app, SqlOptions& options);
+void addStatus(CLI::App& app, StatusOptions& options);
 
 } // namespace pallax

@@ -27,6 +27,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax fields | grep -i rsrp         look up a field
   pallax explain earfcn 1850           what a number, a code or a field means
   pallax info drive.pcap               what a recording holds
+  pallax status drive.pcap             the radio at its end, in a few lines
   pallax sql drive.pcap 'select ...'   any question
 
 Each command has its own help (pallax decode --help). To open a recording with

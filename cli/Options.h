@@ -8,6 +8,7 @@
 #include "decoding/InfoCommand.h"
 #include "decoding/SnapshotCommand.h"
 #include "explaining/ExplainCommand.h"
+#include "inspecting/StatusCommand.h"
 #include "querying/SqlCommand.h"
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
@@ -35,7 +36,7 @@ struct ServiceStatusOptions {};
 using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions, InfoOptions,
-                 SnapshotOptions, SqlOptions, ParseEnd>;
+                 SnapshotOptions, SqlOptions, StatusOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -37,6 +37,7 @@ struct Run {
     ExitStatus operator()(const SnapshotOptions& options) const { return runSnapshot(options); }
     ExitStatus operator()(const InfoOptions& options) const { return runInfo(options); }
     ExitStatus operator()(const SqlOptions& options) const { return runSql(options); }
+    ExitStatus operator()(const StatusOptions& options) const { return runStatus(options); }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);

@@ -249,6 +249,25 @@ TEST_F(EndToEndStatus, OfConditions) {
     ends({{"decode", "--where", "quality('x', time, 'android') is null", sample}, 0, ""});
 }
 
+TEST_F(EndToEndStatus, OfStatus) {
+    const std::string empty = world.path("broken.pcap");
+    ends({{"status", sample}, 0, ""});
+    ends({{"status", empty}, 1, "pallax: " + empty + " is empty.\n"});
+    ends({{"status", "--json", sample},
+          1,
+          "pallax: Standard output cannot be written: No space left on device.\n",
+          "/dev/null",
+          "/dev/full"});
+    ends({{"status"}, 2, "pallax: RECORDING is required (see pallax status --help)\n"});
+    ends(
+        {{"status", "--profile", "fields", sample},
+         2,
+         "pallax: profile \"fields\" is not one of android|field|operator. Did you mean \"field\"? "
+         "(see pallax status --help)\n"});
+    ends({{"status", missing}, 3, isMissing});
+    expectEveryDocumentedStatus({"status"});
+}
+
 TEST_F(EndToEndStatus, OfSql) {
     ends({{"sql", sample, "select count(*) from packet"}, 0, ""});
     ends({{"sql", missing, "select 1"}, 1, isMissing});

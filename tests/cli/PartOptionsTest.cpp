@@ -95,6 +95,23 @@ TEST(Options, SnapshotTakesAFile) {
     EXPECT_EQ(parsed<SnapshotOptions>({"snapshot", "--dlf", "a", "-o", "b"}).output, "b");
 }
 
+TEST(Options, AStatusIsOfOneRecordingAtATime) {
+    const auto plain = parsed<StatusOptions>({"status", "a"});
+    EXPECT_EQ(plain.recording, "a");
+    EXPECT_FALSE(plain.at);
+    EXPECT_FALSE(plain.json);
+    EXPECT_EQ(plain.profile, "android");
+    EXPECT_EQ(plain.technology, nullptr);
+    const auto all = parsed<StatusOptions>(
+        {"status", "a", "--at", "14:03", "--json", "--profile", "own", "--technology", "lte"});
+    EXPECT_TRUE(all.at);
+    EXPECT_TRUE(all.json);
+    EXPECT_EQ(all.profile, "own");
+    EXPECT_EQ(all.technology->commandName, "lte");
+    EXPECT_EQ(ended({"status", "a", "--at", "noon"}).status, kExitWrongUsage);
+    EXPECT_EQ(ended({"status", "a", "b"}).status, kExitWrongUsage);
+}
+
 TEST(Options, InfoTakesFiles) {
     const auto info = parsed<InfoOptions>({"info", "a.pcap", "--json", "-"});
     EXPECT_EQ(info.files, (std::vector<std::string>{"a.pcap", "-"}));

@@ -1,0 +1,81 @@
+#include "inspecting/StatusCommand.h"
+
+#include "LogGenerator/Technologies/Technologies.h"
+#include "console/Output.h"
+#include "decoding/DroppedNotices.h"
+#include "decoding/RequiredTemplates.h"
+#include "fields/Reference.h"
+#include "host/BuildBundle.h"
+#include "host/Complaint.h"
+#include "host/KnowledgeFiles.h"
+#include "host/UserFolders.h"
+#include "host/WallClock.h"
+#include "inspecting/StatusText.h"
+#include "inspecting/ViewedFile.h"
+#include "overview/Status.h"
+#include "text/Format.h"
+
+#include <unistd.h>
+
+namespace pallax {
+
+ExitStatus StatusCommand::run(Output& output) {
+    const auto refuse = [this](const NotSeen& reason) {
+        _environment.report(reason.sentence);
+        return reason.isEmpty ? kExitFailure : kExitCouldNotTell;
+    };
+    const auto file =
+        ViewedFile::open(_options.recording, _options.technology, _environment.decoder);
+    if (!file) {
+        return refuse(file.error());
+    }
+    const Clock& zone = _environment.zone;
+    const auto moment =
+        (*file)->at(_options.at, [&zone](Time time) { return zone.zone(time).offset; });
+    const std::vector<std::string> notes = (*file)->notes();
+    for (const std::string& note : notes) {
+        _environment.report(note);
+    }
+    if (!moment) {
+        return refuse(moment.error());
+    }
+    const Status status =
+        statusOf(moment->values, moment->time, _environment.names, _environment.profile);
+    if (status.isEmpty()) {
+        return refuse({formatText("%@ tells nothing about the radio by then.", {(*file)->name()}),
+                       notes.empty()});
+    }
+    const TechnologyReference technology =
+        gatherReference((*file)->technology(), _environment.decoder.resources);
+    const StatusOrigin origin{(*file)->name(), technology.technology->commandName, technology.title,
+                              zone.zone(moment->time).offset,
+                              moment->packet != 0 ? std::optional(moment->packet) : std::nullopt};
+    (_options.json ? appendStatusJson : appendStatusText)(output.text(), origin, status);
+    output.flush();
+    return notes.empty() ? kExitSuccess : kExitCouldNotTell;
+}
+
+ExitStatus runStatus(const StatusOptions& options) {
+    const auto profile = loadProfile(options.profile, profileFolder());
+    if (!profile) {
+        complain(profile.error().sentence +
+                 (profile.error().isUnknown ? " (see pallax status --help)" : ""));
+        return profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+    }
+    const InstalledNames installed = readInstalledNames(dataFolders());
+    for (const std::string& complaint : installed.complaints) {
+        complain(complaint);
+    }
+    const RequiredTemplates resources(DirectoryResources::programFolder());
+    const BuildBundle bundle;
+    DroppedNotices notices;
+    const WallClock zone;
+    const DecoderEnvironment decoder{resources, bundle, notices, technologies()};
+    const StatusCommand::Environment environment{
+        decoder, installed.names, *profile, zone,
+        [](const std::string& sentence) { complain(sentence); }};
+    Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
+    return StatusCommand(options, environment).run(output);
+}
+
+} // namespace pallax

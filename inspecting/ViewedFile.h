@@ -1,0 +1,64 @@
+#pragma once
+
+#include "querying/RecordedTimeline.h"
+#include "text/TimeText.h"
+#include "timeline/CurrentValues.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace pallax {
+
+/// Why a file does not show what was asked for.
+struct NotSeen {
+    std::string sentence;
+    bool isEmpty = false; ///< it can be read, and holds nothing
+};
+
+/// The values of a file at one time.
+struct Moment {
+    CurrentValues values; ///< valid as long as the file
+    Time time;
+    std::uint64_t packet = 0; ///< 0 in a snapshot
+};
+
+/// A recording or a saved snapshot whose values can be seen at any of its times.
+class ViewedFile {
+public:
+    /// `technology` overrides that of a recording; null: its own.
+    static Result<std::unique_ptr<ViewedFile>, NotSeen> open(const std::string& path,
+                                                             const RecordedTechnology* technology,
+                                                             const DecoderEnvironment& environment);
+
+    /// At that time, or at the end. In a snapshot: the latest display that is not later.
+    Result<Moment, NotSeen> at(const std::optional<TimeText>& time, const ZoneRule& zone);
+
+    const std::string& name() const { return _name; }
+    const RecordedTechnology& technology() const { return *_technology; }
+    /// Sentences about what is missing or damaged; empty if all is well.
+    std::vector<std::string> notes() const;
+
+private:
+    struct Display {
+        Time time;
+        CurrentValues values;
+    };
+
+    ViewedFile() = default;
+    static Result<std::unique_ptr<ViewedFile>, NotSeen>
+    openSnapshot(Recording& recording, const DecoderEnvironment& environment);
+    TimeSpan span() const;
+
+    std::string _name;
+    const RecordedTechnology* _technology = nullptr;
+    std::vector<std::string> _notes;
+    std::unique_ptr<RecordedTimeline> _recorded; ///< null: it is a snapshot
+    std::unique_ptr<FieldTable> _fields;         ///< of a snapshot
+    EntryTable _entries;
+    std::vector<Display> _displays; ///< oldest first
+};
+
+} // namespace pallax

@@ -1,0 +1,108 @@
+#include "inspecting/StatusText.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <sstream>
+
+namespace pallax {
+namespace {
+
+constexpr Time kNow{std::chrono::seconds(1700000000)};
+
+StatusValue value(const char* name, const std::string& text, int age = 0) {
+    return {name, "", text, 0.0, Grade::Good, kNow - std::chrono::seconds(age)};
+}
+
+std::string textOf(const Status& status) {
+    std::string text;
+    appendStatusText(text, {"a.pcap", "lte", "LTE"}, status);
+    return text;
+}
+
+Status emptyStatus() {
+    Status status;
+    status.time = kNow;
+    status.profile = "field";
+    return status;
+}
+
+TEST(StatusText, AValueThatIsOldSaysSo) {
+    Status status = emptyStatus();
+    status.cells.push_back(
+        {"LTE", "", {value("PCI", "1", 10)}, value("EARFCN", "1850", 11), "", {}, {}});
+    EXPECT_EQ(textOf(status), "LTE · 2023-11-14 22:13:20 · a.pcap\n"
+                              "cell        PCI 1 · EARFCN 1850 · 11 s ago\n");
+    status.cells.front().channel->read = kNow - std::chrono::seconds(119);
+    EXPECT_NE(textOf(status).find("119 s ago\n"), std::string::npos);
+    status.cells.front().channel->read = kNow - std::chrono::seconds(179);
+    EXPECT_NE(textOf(status).find("2 min ago\n"), std::string::npos);
+}
+
+TEST(StatusText, FitsTenLinesOfEightyColumnsAndKeepsTheProfile) {
+    Status status = emptyStatus();
+    const std::string wide = "ä long text of a modem that goes on and on";
+    status.network =
+        StatusOperator{NetworkCode{"262", "42"}, wide, "Germany", NameSource::Sim, true};
+    for (const char* system : {"GSM", "UMTS"}) {
+        status.cells.push_back({system,
+                                wide,
+                                {value("PCI", wide), value("TAC", wide)},
+                                value("EARFCN", wide),
+                                wide,
+                                1870.0,
+                                {value("RSRP", wide), value("RSRQ", wide)}});
+        status.neighbours.push_back({system, wide, value("RSRP", wide)});
+    }
+    status.states = {value("MM", wide), value("GMM", wide), value("RR", wide)};
+    status.contexts = {{wide, wide}, {wide, wide}, {"b", ""}};
+    const std::string text = textOf(status);
+    EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 10) << text;
+    std::istringstream lines(text);
+    for (std::string line; std::getline(lines, line);) {
+        const auto columns = std::count_if(line.begin(), line.end(), [](char byte) {
+            return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U;
+        });
+        EXPECT_LE(columns, 80) << line;
+        EXPECT_GT(columns, 12) << line;
+    }
+    EXPECT_NE(text.find("levels      profile field · GSM RSRP"), std::string::npos) << text;
+    EXPECT_NE(text.find("…\n"), std::string::npos) << text;
+}
+
+TEST(StatusText, TextsOfAModemStayInTheirLine) {
+    Status status = emptyStatus();
+    status.contexts = {{"a\nb\x1B[2J", "c"}};
+    EXPECT_EQ(textOf(status), "LTE · 2023-11-14 22:13:20 · a.pcap\n"
+                              "contexts    a\\x0Ab\\x1B[2J c\n");
+}
+
+TEST(StatusText, AStateNamesItsMachineOnce) {
+    Status status = emptyStatus();
+    status.states = {value("MM", "MM_IDLE"), value("RRC", "Disconnected"), value("RR", "RRC_X")};
+    EXPECT_NE(textOf(status).find("state       MM_IDLE · RRC Disconnected · RR RRC_X\n"),
+              std::string::npos);
+}
+
+TEST(StatusText, WithoutGradesNoProfileIsNamed) {
+    Status status = emptyStatus();
+    status.cells.push_back({"LTE", "", {}, {}, "", {}, {value("RSRP", "-90 dBm")}});
+    EXPECT_NE(textOf(status).find("levels      profile field · RSRP -90 dBm good\n"),
+              std::string::npos);
+    status.cells.front().levels.front().grade = std::nullopt;
+    EXPECT_NE(textOf(status).find("levels      RSRP -90 dBm\n"), std::string::npos);
+}
+
+TEST(StatusText, OnlyThreeNeighboursAreShown) {
+    Status status = emptyStatus();
+    for (const char* cell : {"A", "B", "C", "D"}) {
+        status.neighbours.push_back({"LTE", cell, value("RSRP", "1")});
+    }
+    EXPECT_NE(textOf(status).find("neighbours  A 1 · B 1 · C 1\n"), std::string::npos);
+    std::string json;
+    appendStatusJson(json, {"a.pcap", "lte", "LTE"}, status);
+    EXPECT_NE(json.find(R"("cell":"D")"), std::string::npos) << "JSON has all";
+}
+
+} // namespace
+} // namespace pallax
