@@ -162,14 +162,14 @@ bool BoundedJournal::hasFile() {
     if (_file) {
         return true;
     }
-    std::error_code failed;
     if (_folder.empty()) {
         errno = ENOENT;
         return false;
     }
-    std::filesystem::create_directories(_folder, failed);
+    std::error_code failed; // the file cannot be made then
     std::string path = _folder + "/journal-XXXXXX";
     const mode_t before = ::umask(S_IRWXG | S_IRWXO);
+    std::filesystem::create_directories(_folder, failed);
     _file = Descriptor(::mkostemp(path.data(), O_CLOEXEC));
     (void)::umask(before);
     if (_file) {

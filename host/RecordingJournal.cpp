@@ -1,9 +1,11 @@
 #include "host/RecordingJournal.h"
 
+#include "host/Decompression.h"
 #include "host/RecordingFile.h"
 #include "text/Format.h"
 
 #include <algorithm>
+#include <fstream>
 #include <sys/stat.h>
 #include <utility>
 
@@ -153,7 +155,12 @@ private:
 };
 
 bool RecordingJournal::isSuitable(const std::string& path) {
-    return !RecordingFile::isStream(path) && regularFile(path).has_value();
+    if (RecordingFile::isStream(path) || !regularFile(path)) {
+        return false;
+    }
+    const int first = std::ifstream(path, std::ios::binary).get();
+    return first == std::ifstream::traits_type::eof() ||
+           !mayBeCompressed(static_cast<std::uint8_t>(first));
 }
 
 Result<std::unique_ptr<RecordingJournal>, RecordingError>

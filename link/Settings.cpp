@@ -5,7 +5,10 @@
 #include "text/Format.h"
 #include "text/KeyValues.h"
 
+#include <array>
 #include <charconv>
+#include <chrono>
+#include <cstdint>
 #include <filesystem>
 #include <system_error>
 
@@ -16,12 +19,40 @@ namespace {
 constexpr std::string_view kFile = "pallax/pallax.conf";
 constexpr std::string_view kSystemFolder = "/etc/xdg";
 
-std::optional<int> logLevelIn(std::string_view text) {
-    constexpr int kHighestLevel = 7;
-    int level = 0;
-    const auto result = std::from_chars(text.data(), text.data() + text.size(), level);
+/// A setting whose value is a whole number in a range.
+struct NumberSetting {
+    std::string_view key;
+    int least;
+    int most;
+    void (*set)(Settings& settings, int value);
+};
+
+constexpr unsigned kMebibyteShift = 20;
+
+constexpr std::array kNumberSettings{
+    NumberSetting{"system-log-level", 0, 7,
+                  [](Settings& settings, int level) { settings.systemLogLevel = level; }},
+    NumberSetting{
+        "journal-hours", 1, 8760,
+        [](Settings& settings, int hours) { settings.journal.age = std::chrono::hours(hours); }},
+    NumberSetting{"journal-mebibytes", 1, 65536,
+                  [](Settings& settings, int mebibytes) {
+                      settings.journal.bytes = static_cast<std::uint64_t>(mebibytes)
+                                               << kMebibyteShift;
+                  }},
+};
+
+std::optional<std::string> takeNumber(Settings& settings, const NumberSetting& setting,
+                                      std::string_view text) {
+    int number = 0;
+    const auto result = std::from_chars(text.data(), text.data() + text.size(), number);
     const bool isWhole = result.ec == std::errc() && result.ptr == text.data() + text.size();
-    return isWhole && level >= 0 && level <= kHighestLevel ? std::optional(level) : std::nullopt;
+    if (!isWhole || number < setting.least || number > setting.most) {
+        return formatText("%@ is a number from %d to %d, not \"%@\"",
+                          {setting.key, setting.least, setting.most, text});
+    }
+    setting.set(settings, number);
+    return std::nullopt;
 }
 
 /// Sets one setting; returns the reason if it cannot.
@@ -33,12 +64,10 @@ std::optional<std::string> take(Settings& settings, std::string_view key, std::s
         settings.onFatalRecord = value == "skip" ? OnFatalRecord::Skip : OnFatalRecord::Stop;
         return std::nullopt;
     }
-    if (key == "system-log-level") {
-        const auto level = logLevelIn(value);
-        settings.systemLogLevel = level.value_or(settings.systemLogLevel);
-        return level ? std::nullopt
-                     : std::optional(formatText(
-                           "system-log-level is a number from 0 to 7, not \"%@\"", {value}));
+    for (const NumberSetting& setting : kNumberSettings) {
+        if (key == setting.key) {
+            return takeNumber(settings, setting, value);
+        }
     }
     if (key == "after-reconnect") {
         if (value != "keep" && value != "fresh") {

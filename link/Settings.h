@@ -2,6 +2,7 @@
 
 #include "console/ScopedLog.h"
 #include "decoding/FatalRecord.h"
+#include "host/BoundedJournal.h"
 #include "text/Result.h"
 
 #include <cstddef>
@@ -23,6 +24,7 @@ struct Settings {
     std::optional<std::string> snapshotDirectory;         ///< snapshot-directory = PATH
     std::optional<std::string> saveButtonMarker;          ///< save-button-marker = PATH
     int systemLogLevel = kSyslogLevel;                    ///< system-log-level = 0 ... 7
+    BoundedJournal::Limits journal = {};                  ///< journal-hours, journal-mebibytes
 };
 
 /// One sentence that names file and line.

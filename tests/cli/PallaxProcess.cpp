@@ -78,7 +78,8 @@ std::string programPath() {
 std::vector<std::string> programEnvironment(const World& world) {
     std::vector<std::string> environment = world.environment; // the first of two assignments counts
     environment.insert(environment.end(), {"XDG_RUNTIME_DIR=" + world.path(),
-                                           "XDG_CONFIG_HOME=" + world.path("config"), "TZ=UTC"});
+                                           "XDG_CONFIG_HOME=" + world.path("config"),
+                                           "XDG_STATE_HOME=" + world.path("state"), "TZ=UTC"});
     return environment;
 }
 

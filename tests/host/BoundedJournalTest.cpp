@@ -4,8 +4,10 @@
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
+#include <csignal>
 #include <filesystem>
+#include <optional>
+#include <sys/resource.h>
 #include <sys/stat.h>
 
 namespace pallax {
@@ -63,6 +65,60 @@ TEST_F(BoundedJournalTest, KeepsPacketsInMemoryAndThenInAFileWithoutAName) {
     EXPECT_EQ(firstOf(journal, 20500), 20500U);
     EXPECT_EQ(firstOf(journal, 20501), 0U);
     EXPECT_EQ(journal.trouble(), std::nullopt);
+}
+
+TEST_F(BoundedJournalTest, ItsFolderIsItsUsersAlone) {
+    BoundedJournal journal(state, {24h, 100U << 20U, 1U << 20U});
+    add(journal, 2000);
+    struct stat status {};
+    ASSERT_EQ(::stat(state.c_str(), &status), 0);
+    EXPECT_EQ(status.st_mode & (S_IRWXU | S_IRWXG | S_IRWXO), S_IRWXU);
+}
+
+/// The file in that folder that this process has open without a name.
+std::optional<struct stat> namelessFileIn(const std::string& folder) {
+    for (const auto& entry : std::filesystem::directory_iterator("/proc/self/fd")) {
+        std::error_code closed;
+        const std::string path = std::filesystem::read_symlink(entry.path(), closed);
+        struct stat status {};
+        if (path.starts_with(folder + "/") && ::stat(entry.path().c_str(), &status) == 0 &&
+            status.st_nlink == 0) {
+            return status;
+        }
+    }
+    return std::nullopt;
+}
+
+TEST_F(BoundedJournalTest, ItsFileIsItsUsersAloneAndGoneWithTheJournal) {
+    {
+        BoundedJournal journal(state, {24h, 100U << 20U, 1U << 20U});
+        EXPECT_FALSE(namelessFileIn(state));
+        add(journal, 2000);
+        const auto file = namelessFileIn(state);
+        ASSERT_TRUE(file);
+        EXPECT_EQ(file->st_mode & (S_IRWXU | S_IRWXG | S_IRWXO), unsigned{S_IRUSR | S_IWUSR});
+        EXPECT_GT(file->st_size, 0);
+    }
+    EXPECT_FALSE(namelessFileIn(state));
+}
+
+TEST_F(BoundedJournalTest, OnAFullDiskTheSessionGoesOnInMemoryAndThatIsTold) {
+    struct rlimit before {};
+    ASSERT_EQ(::getrlimit(RLIMIT_FSIZE, &before), 0);
+    const auto handler = std::signal(SIGXFSZ, SIG_IGN);
+    const rlimit small{3U << 20U, before.rlim_max};
+    ASSERT_EQ(::setrlimit(RLIMIT_FSIZE, &small), 0);
+    BoundedJournal journal(state, {24h, 100U << 20U, 1U << 20U});
+    add(journal, 2000);
+    EXPECT_EQ(journal.trouble(), std::nullopt);
+    add(journal, 10000);
+    (void)::setrlimit(RLIMIT_FSIZE, &before);
+    (void)std::signal(SIGXFSZ, handler);
+    EXPECT_EQ(journal.trouble(), "Packets cannot be kept in " + state +
+                                     " (File too large); only the latest are, in memory.");
+    EXPECT_LE(journal.bytes(), 1U << 20U);
+    EXPECT_EQ(firstOf(journal, 1), journal.first());
+    EXPECT_GT(journal.first(), 10000U);
 }
 
 TEST_F(BoundedJournalTest, DropsTheOldestPacketsAndUsesTheirPlacesAgain) {

@@ -1,6 +1,7 @@
 #include "host/RecordingJournal.h"
 
 #include "host/RecordingWriter.h"
+#include "tests/doubles/Compression.h"
 #include "tests/doubles/Files.h"
 
 #include <gtest/gtest.h>
@@ -142,6 +143,9 @@ TEST_F(RecordingJournalTest, OnlyRegularFilesAreSuitable) {
     EXPECT_FALSE(RecordingJournal::isSuitable("-"));
     EXPECT_FALSE(RecordingJournal::isSuitable(folder.path("missing")));
     EXPECT_FALSE(RecordingJournal::isSuitable("/dev/null"));
+    EXPECT_FALSE(RecordingJournal::isSuitable(folder.write("drive.gz", doubles::gzipOf("pcap"))));
+    EXPECT_FALSE(RecordingJournal::isSuitable(folder.write("drive.zst", doubles::zstdOf("pcap"))));
+    EXPECT_TRUE(RecordingJournal::isSuitable(folder.write("empty", "")));
     EXPECT_FALSE(RecordingJournal::open(folder.path("missing")));
 }
 

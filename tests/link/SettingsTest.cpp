@@ -25,6 +25,8 @@ TEST(Settings, AreReadLineByLine) {
                                         "snapshot-directory=/tmp/a = b\n"
                                         "system-log-level = 4\n"
                                         "after-reconnect = fresh\n"
+                                        "journal-hours = 2\n"
+                                        "journal-mebibytes = 65536\n"
                                         "save-button-marker = /tmp/marker",
                                         "pallax.conf");
     ASSERT_TRUE(settings);
@@ -33,6 +35,8 @@ TEST(Settings, AreReadLineByLine) {
     EXPECT_EQ(settings->saveButtonMarker, "/tmp/marker");
     EXPECT_EQ(settings->systemLogLevel, 4);
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Fresh);
+    EXPECT_EQ(settings->journal.age, std::chrono::hours(2));
+    EXPECT_EQ(settings->journal.bytes, std::uint64_t{64} << 30U);
     EXPECT_EQ(parseSettings("after-reconnect = keep", "pallax.conf")->afterReconnect,
               AfterReconnect::Keep);
 }
@@ -45,6 +49,8 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
     EXPECT_EQ(settings->saveButtonMarker, std::nullopt);
     EXPECT_EQ(settings->systemLogLevel, 3);
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Keep);
+    EXPECT_EQ(settings->journal.age, std::chrono::hours(24));
+    EXPECT_EQ(settings->journal.bytes, std::uint64_t{256} << 20U);
 }
 
 TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
@@ -61,6 +67,18 @@ TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
                   std::string("pallax.conf, line 2: system-log-level is a number from 0 to 7, "
                               "not \"") +
                       level + "\".");
+    }
+    for (const char* hours : {"0", "8761", "1.5", "1h", ""}) {
+        EXPECT_EQ(sentenceFor(std::string("journal-hours = ") + hours),
+                  std::string("pallax.conf, line 1: journal-hours is a number from 1 to 8760, "
+                              "not \"") +
+                      hours + "\".");
+    }
+    for (const char* size : {"0", "-5", "65537", "1G"}) {
+        EXPECT_EQ(sentenceFor(std::string("journal-mebibytes = ") + size),
+                  std::string("pallax.conf, line 1: journal-mebibytes is a number from 1 to 65536, "
+                              "not \"") +
+                      size + "\".");
     }
     EXPECT_EQ(sentenceFor("skip"), "pallax.conf, line 1: a setting is written \"key = value\".");
 }

@@ -99,7 +99,8 @@ TEST(ManualPage, TheProgramWritesIt) {
 TEST(ManualPage, TheSettingsPageNamesEverySetting) {
     const std::string page = plain(contentOf(PALLAX_SOURCE_DIR "/docs/man/pallax.conf.5"));
     for (const char* setting :
-         {"on-fatal-record", "snapshot-directory", "save-button-marker", "system-log-level"}) {
+         {"on-fatal-record", "snapshot-directory", "save-button-marker", "system-log-level",
+          "after-reconnect", "journal-hours", "journal-mebibytes"}) {
         EXPECT_NE(page.find(std::string(".BR ") + setting), std::string::npos) << setting;
     }
 }
