@@ -56,6 +56,11 @@ std::string loopRefusal(const Source& source, const PlayOptions& play) {
     return sourceName(source) + " can be played only once, not with --loop";
 }
 
+/// Why there is nothing to look into; otherwise empty.
+std::string missingRecording(const std::vector<std::string>& recordings, bool isLive) {
+    return recordings.empty() && !isLive ? "RECORDING is required" : "";
+}
+
 /// Adds the help and version flags of every command.
 void prepare(CLI::App& app) {
     app.formatter(std::make_shared<HelpFormatter>());
@@ -177,6 +182,13 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (const auto refusal = decodeRefusal(_decode); !refusal.empty()) {
         return wrongUsage(refusal, "decode");
+    }
+    for (const auto& [command, refusal] :
+         {std::pair("events", missingRecording(_events.recordings, _events.live)),
+          std::pair("sql", missingRecording(_sql.words, _sql.live))}) {
+        if (_app->got_subcommand(command) && !refusal.empty()) {
+            return wrongUsage(refusal, command);
+        }
     }
     if (!_shell.empty()) {
         return ParseEnd{kExitSuccess, completionScript(description(), _shell)};

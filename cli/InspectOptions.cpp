@@ -45,6 +45,7 @@ constexpr const char* kSqlFooter = R"(Examples:
       from serving_cell_measurements group by 1'
   pallax sql drive.pcap --format csv --file worst-cells.sql > worst.csv
   pallax sql drive.pcap
+  pallax sql --live --for 60 'select time_text(time), words from event'
 
 Without a query, those that you type are answered, or those on standard input;
 each ends with ";". On a terminal, Tab completes names, Ctrl-C stops a query or
@@ -72,6 +73,11 @@ The functions band(technology, channel), mhz(technology, channel),
 operator(mcc, mnc), cell_site(technology, identity), quality(field, value) or
 quality(field, value, profile), time_text(time) and the aggregate
 quantile(value, weight, q) are there beside those of SQLite.
+
+With --live, the query is about the packets of the live modem from now until
+Ctrl-C, the end of its source, or --for. They are kept, and so are recordings
+that cannot be read from the middle (from a pipe, compressed, or several):
+256 MiB and, live, 24 hours at most (pallax.conf(5), journal-mebibytes).
 
 Several recordings are one, in the order of their times, and each continues the
 state of the one before. A column of numbers is
@@ -121,6 +127,7 @@ void addSql(CLI::App& app, SqlOptions& options) {
         {{"table", RowFormat::Table}, {"csv", RowFormat::Csv}, {"json", RowFormat::Json}},
         "A table, CSV, or JSON, one object per row (default: table)");
     app.add_option("--file", options.file, "Read the query from this file")->type_name("FILE");
+    addLive(app, options.live, options.duration);
     app.add_option_function<std::string>(
            "--timeout",
            [&options](const std::string& text) {
@@ -133,7 +140,6 @@ void addSql(CLI::App& app, SqlOptions& options) {
            "Stop a query that takes longer (default: never)")
         ->type_name("SECONDS");
     app.add_option("RECORDING", options.words, "Recordings (pcap or pcapng); then the query")
-        ->required()
         ->type_name("");
     app.footer(kSqlFooter);
 }

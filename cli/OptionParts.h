@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <charconv>
+#include <chrono>
 #include <optional>
 #include <string>
 #include <system_error>
@@ -62,6 +63,9 @@ void addTechnology(CLI::App& app, const std::string& name, const RecordedTechnol
 /// An option that takes a time of a recording.
 CLI::Option* addTime(CLI::App& app, const std::string& name, std::optional<TimeText>& time,
                      const std::string& description);
+
+/// --live, and --for SECONDS with it.
+CLI::Option* addLive(CLI::App& app, bool& live, std::optional<std::chrono::nanoseconds>& duration);
 
 /// --speed X|max.
 CLI::Option* addSpeed(CLI::App& app, PlayOptions& play);

@@ -44,6 +44,7 @@ constexpr const char* kEventsFooter = R"(Examples:
   pallax events --json drive.pcap | jq -r 'select(.kind == "ping-pong").time'
   pallax events --where "kind = 'gap' or measured_rsrp < -110" drive.pcap
   modem-dump | pallax events -
+  pallax events --live
 
 A line has the local time, the kind and the words of an event: cell-change,
 ping-pong (back in the cell before within 10 s), state-change,
@@ -62,7 +63,8 @@ one, in the order of their times; a part that is not given is left out, and the
 first begins without a state.
 
 A record that cannot be read ends the events of its recording. Events from a
-pipe are written when they happen.
+pipe are written when they happen, and so are those of the live modem (--live),
+until Ctrl-C, the end of its source, or a change of its technology.
 
 Exit status:
   0   success, or the reader of the output has gone
@@ -198,8 +200,9 @@ void addEvents(CLI::App& app, EventsOptions& options) {
     app.add_flag("--json", options.json, "JSON, one object per line");
     app.add_option("--where", options.where, "List only the events for which this holds")
         ->type_name("CONDITION");
+    CLI::Option* live = addLive(app, options.live, options.duration);
     app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
-        ->required()
+        ->excludes(live)
         ->type_name("");
     app.footer(kEventsFooter);
 }

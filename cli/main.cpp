@@ -7,6 +7,7 @@
 #include "decoding/SnapshotCommand.h"
 #include "host/Complaint.h"
 #include "host/StandardDescriptors.h"
+#include "live/LiveEvents.h"
 #include "recording/Record.h"
 #include "telephony/ChildService.h"
 
@@ -31,7 +32,9 @@ struct Run {
         return printServiceStatus() == 0 ? kExitSuccess : kExitFailure;
     }
     ExitStatus operator()(const SimulateOptions& options) const { return runSimulate(options); }
-    ExitStatus operator()(const EventsOptions& options) const { return runEvents(options); }
+    ExitStatus operator()(const EventsOptions& options) const {
+        return options.live ? runLiveEvents(options) : runEvents(options);
+    }
     ExitStatus operator()(const FieldsOptions& options) const { return runFields(options); }
     ExitStatus operator()(const ExplainOptions& options) const { return runExplain(options); }
     ExitStatus operator()(const SnapshotOptions& options) const { return runSnapshot(options); }

@@ -221,7 +221,7 @@ ExitStatus EventsCommand::tellEvents(Recording& recording, const RecordedTechnol
     return kExitSuccess;
 }
 
-ExitStatus runEvents(const EventsOptions& options) {
+ExitStatus runEvents(const EventsOptions& options, const DecodeCommand::Open& open) {
     if (const auto loss = outputIntoRecording(options.recordings)) {
         complain(*loss);
         return kExitFailure;
@@ -233,11 +233,14 @@ ExitStatus runEvents(const EventsOptions& options) {
     const DecoderEnvironment environment{resources, bundle, notices, technologies(),
                                          installedKnowledge()};
     const auto report = [](std::string_view sentence) { complain(sentence); };
-    const auto open = [&report](const std::string& path) {
-        return Recording::openInput({path, {}, report});
-    };
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     return EventsCommand(options, environment, open, report, zone).run(output);
+}
+
+ExitStatus runEvents(const EventsOptions& options) {
+    return runEvents(options, [](const std::string& path) {
+        return Recording::openInput({path, {}, complain});
+    });
 }
 
 } // namespace pallax

@@ -4,7 +4,9 @@
 #include "decoding/DecodeCommand.h"
 #include "host/RecordingParts.h"
 
+#include <chrono>
 #include <functional>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -20,6 +22,8 @@ struct EventsOptions {
     const RecordedTechnology* technology = nullptr;
     bool json = false;
     std::optional<std::string> where = {}; ///< condition on the events to write
+    bool live = false;                     ///< of the live modem, without recordings
+    std::optional<std::chrono::nanoseconds> duration = {}; ///< live; if missing, until a signal
 };
 
 /// Writes a line for each event of the recordings, in the order of the command line: local time,
@@ -50,7 +54,9 @@ private:
     bool _areSeveral = false; ///< recordings
 };
 
-/// `EventsCommand`, wired to this machine.
+/// `EventsCommand`, wired to this machine; `open` opens what the options name.
+ExitStatus runEvents(const EventsOptions& options, const DecodeCommand::Open& open);
+/// The same for recordings.
 ExitStatus runEvents(const EventsOptions& options);
 
 } // namespace pallax

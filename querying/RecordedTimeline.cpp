@@ -43,13 +43,25 @@ OpenResult openFile(const std::string& path) {
     return opened;
 }
 
+std::string droppedText(const Recording& recording, const BoundedJournal& journal,
+                        std::uint64_t limit) {
+    constexpr unsigned kMebibyteShift = 20;
+    const std::string dropped = formatText("%@: the packets before packet %llu were dropped",
+                                           {recording.name(), journal.first()});
+    return journal.trouble() ? dropped + "."
+                             : formatText("%@ to keep at most %llu MiB (journal-mebibytes).",
+                                          {dropped, limit >> kMebibyteShift});
+}
+
 /// Reads a source that cannot be read again, or not in one piece.
 OpenResult keep(const RecordedTimeline::Request& request) {
     const auto recording = openRecordings(request.recordings);
     if (!recording) {
         return recording.error();
     }
-    auto journal = std::make_unique<BoundedJournal>(BoundedJournal::stateFolder());
+    BoundedJournal::Limits limits = request.journal;
+    limits.age = std::chrono::nanoseconds::max();
+    auto journal = std::make_unique<BoundedJournal>(BoundedJournal::stateFolder(), limits);
     std::uint64_t packets = 0;
     while (const auto packet = (*recording)->next()) {
         journal->add(packet->time, packet->data);
@@ -65,8 +77,7 @@ OpenResult keep(const RecordedTimeline::Request& request) {
         opened.notes.push_back(error->sentence);
     }
     if (journal->first() > 1) {
-        opened.notes.push_back(formatText("%@: only the packets from %llu on were kept.",
-                                          {(*recording)->name(), journal->first()}));
+        opened.notes.push_back(droppedText(**recording, *journal, limits.bytes));
     }
     opened.journal = std::move(journal);
     return opened;
@@ -110,10 +121,6 @@ std::vector<std::string> RecordedTimeline::notes() const {
     std::vector<std::string> notes = _notes;
     for (std::string& note : _timeline->notes()) {
         notes.push_back(std::move(note));
-    }
-    if (_timeline->hasEnded()) {
-        const Event& fatal = _timeline->events().back();
-        notes.push_back(formatText("Packet %llu cannot be read: %@", {fatal.packet, fatal.words}));
     }
     return notes;
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "decoding/RecordingDecoder.h"
+#include "host/BoundedJournal.h"
 #include "host/Recording.h"
 #include "packets/PacketJournal.h"
 #include "text/Result.h"
@@ -21,6 +22,8 @@ public:
         std::vector<std::string>
             recordings; ///< not empty; several are one, in order of their times
         const RecordedTechnology* technology = nullptr; ///< overrides the link type
+        /// For what cannot be read again; its age does not count, as a whole recording is wanted.
+        BoundedJournal::Limits journal = {};
         /// Called now and then with the number of packets that were read.
         std::function<void(std::uint64_t packets)> progress = {};
     };

@@ -13,6 +13,8 @@
 #include "host/Files.h"
 #include "host/MonotonicClock.h"
 #include "host/WallClock.h"
+#include "link/Settings.h"
+#include "live/LiveSession.h"
 #include "query/Functions.h"
 #include "query/TimelineTables.h"
 #include "querying/EditedLines.h"
@@ -63,6 +65,18 @@ Result<Question, Refusal> questionOf(const SqlOptions& options) {
         question.recordings.pop_back();
     }
     const auto& recordings = question.recordings;
+    if (options.live) {
+        // Without recordings, a single word is the query.
+        if (recordings.size() == 1 && !question.query) {
+            question.query = std::move(question.recordings.front());
+            question.recordings.clear();
+        }
+        if (!question.query || !recordings.empty()) {
+            return Refusal{"sql --live takes a query and no recording (see pallax sql --help)",
+                           kExitWrongUsage};
+        }
+        return question;
+    }
     const bool isQuery = recordings.size() == 1 && !isRecording(recordings.front()) &&
                          recordings.front().find(' ') != std::string::npos;
     if (recordings.empty() || (isQuery && !question.query)) {
@@ -123,6 +137,73 @@ ExitStatus runShell(QueryRun& run, RowFormat format) {
     return SqlShell(run, *lines, format, SqlShell::Errors::Go).run();
 }
 
+ExitStatus answer(Timeline& timeline, const Question& question, const SqlOptions& options,
+                  Waiting& waiting) {
+    Database database;
+    addTimelineTables(database, timeline);
+    addFunctions(database, installedKnowledge(), &timeline.fields());
+    Output output(waiting.output());
+    const MonotonicClock clock;
+    QueryRun run(database, {options.timeout, !question.query},
+                 {output, clock, [&waiting] { waiting.querying(); },
+                  [&waiting](std::string_view sentence) {
+                      waiting.end();
+                      complain(sentence);
+                  }});
+    const ExitStatus status =
+        question.query ? run.run(*question.query, options.format) : runShell(run, options.format);
+    waiting.end();
+    return status;
+}
+
+/// With the notes on a timeline, an answer is not whole.
+ExitStatus withNotes(ExitStatus status, const std::vector<std::string>& notes) {
+    if (status == kExitWrongUsage) {
+        return status;
+    }
+    for (const std::string& note : notes) {
+        complain(note);
+    }
+    return notes.empty() ? status : std::max<ExitStatus>(status, kExitFailure);
+}
+
+ExitStatus askRecordings(const SqlOptions& options, const Settings& settings,
+                         const Question& question) {
+    const RequiredTemplates resources(DirectoryResources::programFolder());
+    const BuildBundle bundle;
+    DroppedNotices notices;
+    const DecoderEnvironment environment{resources, bundle, notices, technologies()};
+    Waiting waiting;
+    const auto recorded =
+        RecordedTimeline::open({question.recordings, options.technology, settings.journal,
+                                [&waiting](std::uint64_t packets) { waiting.reading(packets); }},
+                               environment);
+    waiting.end();
+    if (!recorded) {
+        complain(recorded.error().sentence);
+        return kExitFailure;
+    }
+    const ExitStatus status = answer((*recorded)->timeline(), question, options, waiting);
+    return withNotes(status, (*recorded)->notes());
+}
+
+ExitStatus askLive(const SqlOptions& options, const Settings& settings, const Question& question) {
+    Waiting waiting;
+    LiveSession session({settings, options.technology, options.duration,
+                         [&waiting](Timeline& timeline) { waiting.reading(timeline.packets()); }});
+    auto failure = session.run();
+    waiting.end();
+    Timeline* timeline = session.timeline();
+    if (!failure && timeline == nullptr) {
+        failure = "No packet has come from the live modem.";
+    }
+    if (failure) {
+        complain(*failure);
+        return kExitFailure;
+    }
+    return withNotes(answer(*timeline, question, options, waiting), session.notes());
+}
+
 } // namespace
 
 ExitStatus runSql(const SqlOptions& options) {
@@ -131,39 +212,13 @@ ExitStatus runSql(const SqlOptions& options) {
         complain(question.error().sentence);
         return question.error().status;
     }
-    const RequiredTemplates resources(DirectoryResources::programFolder());
-    const BuildBundle bundle;
-    DroppedNotices notices;
-    const DecoderEnvironment environment{resources, bundle, notices, technologies()};
-    Waiting waiting;
-    const auto recorded =
-        RecordedTimeline::open({question->recordings, options.technology,
-                                [&waiting](std::uint64_t packets) { waiting.reading(packets); }},
-                               environment);
-    waiting.end();
-    if (!recorded) {
-        complain(recorded.error().sentence);
+    const SettingsResult settings = loadSettings(settingsFiles());
+    if (!settings) {
+        complain(settings.error().sentence);
         return kExitFailure;
     }
-    Database database;
-    addTimelineTables(database, (*recorded)->timeline());
-    addFunctions(database, installedKnowledge(), &(*recorded)->timeline().fields());
-    Output output(waiting.output());
-    const MonotonicClock clock;
-    QueryRun run(database, {options.timeout, !question->query},
-                 {output, clock, [&waiting] { waiting.querying(); },
-                  [&waiting](std::string_view sentence) {
-                      waiting.end();
-                      complain(sentence);
-                  }});
-    const ExitStatus status =
-        question->query ? run.run(*question->query, options.format) : runShell(run, options.format);
-    waiting.end();
-    const std::vector<std::string> notes = (*recorded)->notes();
-    for (const std::string& note : notes) {
-        complain(note);
-    }
-    return notes.empty() ? status : std::max<ExitStatus>(status, kExitFailure);
+    return options.live ? askLive(options, *settings, *question)
+                        : askRecordings(options, *settings, *question);
 }
 
 } // namespace pallax

@@ -20,6 +20,8 @@ struct SqlOptions {
     RowFormat format = RowFormat::Table;
     std::optional<std::chrono::nanoseconds> timeout = {}; ///< of each query
     const RecordedTechnology* technology = nullptr;       ///< overrides the link type
+    bool live = false; ///< about the live modem, without recordings
+    std::optional<std::chrono::nanoseconds> duration = {}; ///< live; if missing, until a signal
 };
 
 /// Opens the recordings, runs the query and writes its rows to standard output; without a query,

@@ -1,5 +1,6 @@
 #include "timeline/Timeline.h"
 
+#include "text/Format.h"
 #include "timeline/Indexer.h"
 
 #include <algorithm>
@@ -83,6 +84,10 @@ std::vector<std::string> Timeline::notes() const {
     }
     if (auto trouble = _journal.trouble()) {
         notes.push_back(std::move(*trouble));
+    }
+    if (_hasEnded) {
+        const Event& fatal = _events.back();
+        notes.push_back(formatText("Packet %llu cannot be read: %@", {fatal.packet, fatal.words}));
     }
     return notes;
 }

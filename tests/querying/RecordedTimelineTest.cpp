@@ -2,13 +2,17 @@
 
 #include "LogGenerator/Technologies/Technologies.h"
 #include "host/DirectoryResources.h"
+#include "host/RecordingWriter.h"
 #include "samples/Samples.h"
+#include "tests/doubles/Compression.h"
 #include "tests/doubles/FakeBundle.h"
 #include "tests/doubles/FakeStandardOutput.h"
+#include "tests/doubles/RecordBuilder.h"
 #include "tests/doubles/RuntimeFolder.h"
 
 #include <gtest/gtest.h>
 
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
@@ -31,6 +35,18 @@ protected:
         content.resize(content.size() - bytes);
         std::string path = _folder.file("cut.pcap");
         std::ofstream(path, std::ios::binary) << content;
+        return path;
+    }
+
+    /// A recording of LTE packets of 100 bytes that no record reads.
+    std::string drive(int packets) {
+        std::string path = _folder.file("drive.pcap");
+        const auto writer = RecordingWriter::create(path, 150, RecordingWriter::Flush::InBlocks);
+        const ByteBuffer packet = doubles::Record(1).padTo(100).prefixed();
+        for (int number = 0; number < packets; ++number) {
+            EXPECT_FALSE((*writer)->write(kSampleStart + std::chrono::seconds(number), packet));
+        }
+        EXPECT_FALSE((*writer)->flush());
         return path;
     }
 
@@ -64,6 +80,38 @@ TEST_F(RecordedTimelineTest, OfADamagedRecordingHasWhatIsWholeAndSaysSo) {
     EXPECT_EQ((*opened)->timeline().packets(), lteDrivePackets().size() - 1);
     EXPECT_EQ((*opened)->notes(),
               std::vector<std::string>{path + " ends in the middle of a packet."});
+}
+
+TEST_F(RecordedTimelineTest, OfACompressedRecordingHasAllItsPackets) {
+    const std::string path = _folder.write(
+        "drive.pcap.gz", doubles::gzipOf(doubles::contentOf(sample("lte-drive.pcap"))));
+    const auto opened = open({path});
+    ASSERT_TRUE(opened) << opened.error().sentence;
+    EXPECT_EQ((*opened)->timeline().packets(), lteDrivePackets().size());
+    EXPECT_EQ((*opened)->notes(), std::vector<std::string>());
+}
+
+TEST_F(RecordedTimelineTest, OfWhatCannotBeReadAgainTheLatestPacketsAreKeptAndThatIsTold) {
+    doubles::TemporaryFolder state;
+    (void)::setenv("XDG_STATE_HOME", state.path().c_str(), 1);
+    const std::string plain = drive(30000);
+    const std::string path = _folder.write("a.pcap.gz", doubles::gzipOf(doubles::contentOf(plain)));
+    RecordedTimeline::Request request{{path}};
+    request.journal.age = std::chrono::hours(1); // does not count
+    request.journal.bytes = 2U << 20U;
+    request.journal.memory = 1U << 20U;
+    const auto opened = RecordedTimeline::open(request, _environment);
+    EXPECT_TRUE(std::filesystem::is_empty(state.path("pallax")));
+    (void)::unsetenv("XDG_STATE_HOME");
+    ASSERT_TRUE(opened) << opened.error().sentence;
+    Timeline& timeline = (*opened)->timeline();
+    EXPECT_EQ(timeline.packets(), 30000U);
+    EXPECT_GT(timeline.firstInstant(), 10000U);
+    EXPECT_LT(timeline.firstInstant(), 20000U);
+    EXPECT_EQ((*opened)->notes(),
+              std::vector<std::string>{path + ": the packets before packet " +
+                                       std::to_string(timeline.firstInstant() + 1) +
+                                       " were dropped to keep at most 2 MiB (journal-mebibytes)."});
 }
 
 TEST_F(RecordedTimelineTest, NeedsARecordingThatIsThere) {
