@@ -10,6 +10,7 @@
 #include "decoding/RequiredTemplates.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
+#include "host/FileWatch.h"
 #include "host/JoinedRecording.h"
 #include "host/Snapshot.h"
 #include "host/WallClock.h"
@@ -159,6 +160,7 @@ ExitStatus EventsCommand::tell(const PartPaths& parts, Output& output) {
     if (const auto missing = missingParts(parts)) {
         _report(*missing);
     }
+    const std::vector<FileWatch> watches(parts.begin(), parts.end());
     const auto recording = openParts(parts, _open);
     if (!recording) {
         _report(recording.error().sentence);
@@ -174,7 +176,15 @@ ExitStatus EventsCommand::tell(const PartPaths& parts, Output& output) {
         _report(noTimeOfSnapshot(parts.front()).sentence);
         return kExitFailure;
     }
-    return tellEvents(**recording, *technology, output);
+    ExitStatus status = tellEvents(**recording, *technology, output);
+    for (const FileWatch& watch : watches) {
+        const auto trouble = status == kExitSuccess ? watch.trouble() : std::nullopt;
+        if (trouble) {
+            _report(*trouble);
+            status = kExitFailure;
+        }
+    }
+    return status;
 }
 
 ExitStatus EventsCommand::tellEvents(Recording& recording, const RecordedTechnology& technology,
@@ -216,6 +226,10 @@ ExitStatus EventsCommand::tellEvents(Recording& recording, const RecordedTechnol
     }
     if (recording.error()) {
         _report(recording.error()->sentence);
+        return kExitFailure;
+    }
+    if (timeline.fields().isFull()) { // events may be missing
+        _report(formatText("%@: %@", {recording.name(), FieldTable::kFullNote}));
         return kExitFailure;
     }
     return kExitSuccess;

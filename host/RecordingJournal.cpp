@@ -6,19 +6,11 @@
 
 #include <algorithm>
 #include <fstream>
-#include <sys/stat.h>
 #include <utility>
 
 namespace pallax {
 
 namespace {
-
-std::optional<std::uint64_t> sizeOf(const std::string& path) {
-    struct stat status {};
-    return ::stat(path.c_str(), &status) == 0
-               ? std::optional(static_cast<std::uint64_t>(status.st_size))
-               : std::nullopt;
-}
 
 constexpr std::uint64_t kPcapHeader = 16;
 
@@ -50,7 +42,7 @@ public:
 private:
     void start() {
         _recording.reset();
-        if (!_journal.isSameFile()) {
+        if (!_journal._watch.isSameFile()) {
             return;
         }
         auto opened = Recording::open(_journal._path);
@@ -135,11 +127,11 @@ private:
             _journal._error = error->sentence;
         }
         _continueAt = _next;
-        _sizeAtEnd = sizeOf(_journal._path).value_or(0);
+        _sizeAtEnd = sizeOfFile(_journal._path);
         _recording.reset();
     }
     bool hasGrown() const {
-        return !_journal._hasChanged && sizeOf(_journal._path).value_or(0) > _sizeAtEnd;
+        return !_journal._hasChanged && sizeOfFile(_journal._path) > _sizeAtEnd;
     }
 
     RecordingJournal& _journal;
@@ -165,13 +157,11 @@ bool RecordingJournal::isSuitable(const std::string& path) {
 
 Result<std::unique_ptr<RecordingJournal>, RecordingError>
 RecordingJournal::open(const std::string& path) {
+    std::unique_ptr<RecordingJournal> journal(new RecordingJournal(path));
     const auto opened = Recording::open(path);
     if (!opened) {
         return opened.error();
     }
-    std::unique_ptr<RecordingJournal> journal(new RecordingJournal(path));
-    journal->_identity = regularFile(path).value_or(FileIdentity());
-    journal->_size = sizeOf(path).value_or(0);
     journal->_technology = (*opened)->technology();
     return journal;
 }
@@ -180,30 +170,19 @@ std::unique_ptr<PacketReader> RecordingJournal::reader(std::uint64_t from) {
     return std::make_unique<Reader>(*this, from);
 }
 
-bool RecordingJournal::isSameFile() const {
-    return regularFile(_path) == _identity;
-}
-
 std::optional<std::string> RecordingJournal::trouble() const {
-    if (!isSameFile()) {
-        return formatText("%@ was replaced or removed while it was read.", {_path});
-    }
-    const std::uint64_t size = sizeOf(_path).value_or(0);
-    if (size < _size || size < _read) {
-        return formatText("%@ has become shorter while it was read.", {_path});
+    if (auto trouble = _watch.trouble(_read)) {
+        return trouble;
     }
     if (_hasChanged) {
         return formatText("%@ was changed while it was read.", {_path});
-    }
-    if (size > _size) {
-        return formatText("%@ has grown while it was read.", {_path});
     }
     return _error;
 }
 
 double RecordingJournal::share() const {
-    return _size != 0 ? std::min(static_cast<double>(_read) / static_cast<double>(_size), 1.0)
-                      : 1.0;
+    const std::uint64_t size = _watch.size();
+    return size != 0 ? std::min(static_cast<double>(_read) / static_cast<double>(size), 1.0) : 1.0;
 }
 
 } // namespace pallax

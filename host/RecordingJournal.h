@@ -1,6 +1,6 @@
 #pragma once
 
-#include "host/FileIdentity.h"
+#include "host/FileWatch.h"
 #include "host/Recording.h"
 #include "packets/PacketJournal.h"
 
@@ -42,12 +42,10 @@ private:
     };
     static constexpr std::uint64_t kPlacesEvery = 4096; // packets
 
-    explicit RecordingJournal(std::string path) : _path(std::move(path)) {}
-    bool isSameFile() const;
+    explicit RecordingJournal(const std::string& path) : _path(path), _watch(path) {}
 
     std::string _path;
-    FileIdentity _identity;
-    std::uint64_t _size = 0; // when it was opened
+    FileWatch _watch;
     const RecordedTechnology* _technology = nullptr;
     std::vector<Place> _places;
     std::uint64_t _read = 0; // the end of the packet at the last place

@@ -1,6 +1,7 @@
 #include "querying/RecordedTimeline.h"
 
 #include "host/BoundedJournal.h"
+#include "host/FileWatch.h"
 #include "host/JoinedRecording.h"
 #include "host/RecordingJournal.h"
 #include "host/Snapshot.h"
@@ -55,6 +56,7 @@ std::string droppedText(const Recording& recording, const BoundedJournal& journa
 
 /// Reads a source that cannot be read again, or not in one piece.
 OpenResult keep(const RecordedTimeline::Request& request) {
+    const std::vector<FileWatch> files(request.recordings.begin(), request.recordings.end());
     const auto recording = openRecordings(request.recordings);
     if (!recording) {
         return recording.error();
@@ -75,6 +77,11 @@ OpenResult keep(const RecordedTimeline::Request& request) {
     }
     if (const auto& error = (*recording)->error()) {
         opened.notes.push_back(error->sentence);
+    }
+    for (const FileWatch& file : files) {
+        if (auto trouble = file.trouble()) {
+            opened.notes.push_back(std::move(*trouble));
+        }
     }
     if (journal->first() > 1) {
         opened.notes.push_back(droppedText(**recording, *journal, limits.bytes));

@@ -42,6 +42,9 @@ public:
     bool isObjectStream() const { return _isObjectStream; }
     /// Whether paths of an object stream may be missing because there are too many.
     bool isFull() const { return _rows.size() >= kMostPaths && _isObjectStream; }
+    /// The sentence about that.
+    static constexpr std::string_view kFullNote =
+        "Only the first 4,096 paths of the messages are fields.";
 
     /// The fields that show a sample: usually one; of CDMA, one for each place.
     std::span<const FieldIndex> of(const Sample& sample) {

@@ -74,7 +74,7 @@ std::optional<std::uint64_t> Timeline::instantAt(Time time) const {
 std::vector<std::string> Timeline::notes() const {
     std::vector<std::string> notes;
     if (_fields.isFull()) {
-        notes.emplace_back("Only the first 4,096 paths of the messages are fields.");
+        notes.emplace_back(FieldTable::kFullNote);
     }
     if (_entries.isFull() || _series.isFull()) {
         notes.emplace_back("There are too many list entries to keep a series of each.");

@@ -1,9 +1,15 @@
 #include "decoding/EventsCommand.h"
 
 #include "LogGenerator/Technologies/Technologies.h"
+#include "plist/PropertyListCodec.h"
 #include "tests/decoding/CommandFixture.h"
+#include "tests/doubles/Files.h"
 #include "tests/doubles/ManualClock.h"
 #include "tests/doubles/RecordBuilder.h"
+
+#include <filesystem>
+#include <fstream>
+#include <functional>
 
 namespace pallax {
 namespace {
@@ -25,13 +31,20 @@ protected:
         script(name, std::move(packets), technologyOfCommandName(technology), std::move(atEnd));
     }
     ExitStatus run() {
+        const auto openNow = [this](const std::string& path) {
+            if (opening) {
+                opening(path);
+            }
+            return open()(path);
+        };
         Output output(write());
-        return EventsCommand(options, {resources, bundle, notices, technologies()}, open(),
+        return EventsCommand(options, {resources, bundle, notices, technologies()}, openNow,
                              report(), zone)
             .run(output);
     }
 
     EventsOptions options;
+    std::function<void(const std::string& path)> opening;
     DirectoryResources resources{PALLAX_SOURCE_DIR "/resources"};
     doubles::ManualClock zone;
 };
@@ -124,6 +137,41 @@ TEST_F(EventsCommandTest, AForeignLinkTypeIsAnError) {
     add("a.pcap", {cell(0, 1)}, "umts");
     EXPECT_EQ(run(), kExitFailure);
     EXPECT_EQ(reports, std::vector<std::string>{"a.pcap has a foreign link type"});
+}
+
+TEST_F(EventsCommandTest, TooManyPathsOfMessagesAreTold) {
+    Dictionary many;
+    for (int number = 0; number < 5000; ++number) {
+        many.set("P" + std::to_string(number), "1");
+    }
+    add("a.pcap", {{seconds(0), *serializeXml(many)}}, "ifx");
+    EXPECT_EQ(run(), kExitFailure);
+    EXPECT_EQ(reports, std::vector<std::string>{
+                           "a.pcap: Only the first 4,096 paths of the messages are fields."});
+}
+
+TEST_F(EventsCommandTest, ARecordingThatChangesMeanwhileIsTold) {
+    const doubles::TemporaryFolder folder;
+    const std::string path = folder.write("drive.pcap", "content");
+    const auto reportAfter = [&](std::function<void()> change) {
+        options.recordings.clear();
+        add(path, {cell(0, 1), cell(20, 2)});
+        (void)folder.write("drive.pcap", "content");
+        opening = [&change](const std::string& /*path*/) { change(); };
+        EXPECT_EQ(run(), kExitFailure);
+        return reports.size() == 1 ? reports.front() : std::to_string(reports.size());
+    };
+    EXPECT_EQ(reportAfter([&] { std::ofstream(path, std::ios::app) << "more"; }),
+              path + " has grown while it was read.");
+    EXPECT_EQ(reportAfter([&] { std::filesystem::resize_file(path, 3); }),
+              path + " has become shorter while it was read.");
+    EXPECT_EQ(reportAfter([&] {
+                  (void)folder.write("other.pcap", "content");
+                  std::filesystem::rename(folder.path("other.pcap"), path);
+              }),
+              path + " was replaced or removed while it was read.");
+    EXPECT_EQ(reportAfter([&] { std::filesystem::remove(path); }),
+              path + " was replaced or removed while it was read.");
 }
 
 TEST_F(EventsCommandTest, EventsOfAStreamAreWrittenWhenTheyHappen) {

@@ -114,6 +114,22 @@ TEST_F(RecordedTimelineTest, OfWhatCannotBeReadAgainTheLatestPacketsAreKeptAndTh
                                        " were dropped to keep at most 2 MiB (journal-mebibytes)."});
 }
 
+TEST_F(RecordedTimelineTest, OfRecordingsThatChangeMeanwhileSaysSo) {
+    const std::string path = drive(2000);
+    for (const auto& recordings :
+         {std::vector<std::string>{path}, {path, sample("lte-drive.pcap")}}) {
+        RecordedTimeline::Request request{recordings};
+        request.progress = [&path](std::uint64_t /*packets*/) {
+            std::ofstream(path, std::ios::app) << "more";
+        };
+        const auto opened = RecordedTimeline::open(request, _environment);
+        ASSERT_TRUE(opened) << opened.error().sentence;
+        const auto notes = (*opened)->notes();
+        EXPECT_EQ(std::count(notes.begin(), notes.end(), path + " has grown while it was read."), 1)
+            << testing::PrintToString(notes);
+    }
+}
+
 TEST_F(RecordedTimelineTest, NeedsARecordingThatIsThere) {
     const auto opened = open({_folder.file("nothing.pcap")});
     ASSERT_FALSE(opened);
