@@ -71,11 +71,12 @@ std::vector<std::string> LiveTimeline::notes() const {
     }
     std::vector<std::string> notes = _timeline->notes();
     if (_journal->first() > 1) {
-        notes.push_back(formatText(
-            "The packets before packet %llu were dropped to keep those of %lld hours in "
-            "at most %llu MiB (journal-hours, journal-mebibytes).",
-            {_journal->first(), std::chrono::floor<std::chrono::hours>(_setup.journal.age).count(),
-             _setup.journal.bytes >> kMebibyteShift}));
+        notes.push_back(
+            formatText("The packets before packet %llu were dropped to keep those of %lld hours in "
+                       "at most %llu MiB (journal-hours, journal-mebibytes).",
+                       {_timeline->firstInstant() + 1,
+                        std::chrono::floor<std::chrono::hours>(_setup.journal.age).count(),
+                        _setup.journal.bytes >> kMebibyteShift}));
     }
     return notes;
 }

@@ -157,10 +157,10 @@ TEST_F(LiveTimelineTest, OlderPacketsThanTheLimitsAllowAreDroppedAndThatIsTold) 
     const std::uint64_t first = live.timeline()->firstInstant() + 1;
     EXPECT_GT(first, 1000U);
     ASSERT_EQ(live.notes().size(), 1U);
-    EXPECT_TRUE(live.notes().front().starts_with("The packets before packet "));
-    EXPECT_TRUE(live.notes().front().ends_with(" were dropped to keep those of 2 hours in at most "
-                                               "1 MiB (journal-hours, journal-mebibytes)."))
-        << live.notes().front();
+    EXPECT_EQ(live.notes().front(),
+              "The packets before packet " + std::to_string(first) +
+                  " were dropped to keep those of 2 hours in at most 1 MiB (journal-hours, "
+                  "journal-mebibytes).");
     (void)live.timeline()->valuesAt(packets.size());
 }
 
