@@ -7,28 +7,28 @@ namespace pallax {
 
 namespace {
 
-using Role = StatusField::Role;
+using Kind = StatusField::Role;
 
 constexpr auto kLte = std::to_array<StatusField>({
-    {Role::Site, "cell", "lte.serving_cell_info.cell_identity"},
-    {Role::Identity, "PCI", "lte.serving_cell_info.physical_cell_id"},
-    {Role::Identity, "PCI", "lte.serving_cell_measurements.physical_cell_id"},
-    {Role::Identity, "TAC", "lte.serving_cell_info.tracking_area_code"},
-    {Role::Channel, "EARFCN", "lte.serving_cell_info.download_frequency"},
-    {Role::Channel, "EARFCN", "lte.serving_cell_measurements.e_arfcn"},
-    {Role::Band, "band", "lte.serving_cell_info.freq_band_indicator"},
-    {Role::Level, "RSRP", "lte.serving_cell_measurements.measured_rsrp"},
-    {Role::Level, "RSRP",
+    {Kind::Site, "cell", "lte.serving_cell_info.cell_identity"},
+    {Kind::Identity, "PCI", "lte.serving_cell_info.physical_cell_id"},
+    {Kind::Identity, "PCI", "lte.serving_cell_measurements.physical_cell_id"},
+    {Kind::Identity, "TAC", "lte.serving_cell_info.tracking_area_code"},
+    {Kind::Channel, "EARFCN", "lte.serving_cell_info.download_frequency"},
+    {Kind::Channel, "EARFCN", "lte.serving_cell_measurements.e_arfcn"},
+    {Kind::Band, "band", "lte.serving_cell_info.freq_band_indicator"},
+    {Kind::Level, "RSRP", "lte.serving_cell_measurements.measured_rsrp"},
+    {Kind::Level, "RSRP",
      "lte.connected_mode_lte_intra_frequency_measurement.serving_filtered_rsrp"},
-    {Role::Level, "RSRQ", "lte.serving_cell_measurements.measured_rsrq"},
-    {Role::Level, "RSRQ",
+    {Kind::Level, "RSRQ", "lte.serving_cell_measurements.measured_rsrq"},
+    {Kind::Level, "RSRQ",
      "lte.connected_mode_lte_intra_frequency_measurement.serving_filtered_rsrq"},
 });
 constexpr auto kLteIdle = std::to_array<StatusField>({
-    {Role::Identity, "PCI", "lte.neighbor_cells_list.physical_cell_id"},
+    {Kind::Identity, "PCI", "lte.neighbor_cells_list.physical_cell_id"},
 });
 constexpr auto kLteConnected = std::to_array<StatusField>({
-    {Role::Identity, "PCI", "lte.measured_neighbor_cells.physical_cell_id"},
+    {Kind::Identity, "PCI", "lte.measured_neighbor_cells.physical_cell_id"},
 });
 constexpr auto kLteLists = std::to_array<StatusList>({
     {"RSRP", "lte.neighbor_cells_list.measured_rsrp", kLteIdle},
@@ -36,30 +36,30 @@ constexpr auto kLteLists = std::to_array<StatusList>({
 });
 
 constexpr auto kGsm = std::to_array<StatusField>({
-    {Role::Site, "cell", "gsm.gsm_serving_cell.cell_id"},
-    {Role::Identity, "BSIC", "gsm.gsm_serving_cell.bsic"},
-    {Role::Channel, "ARFCN", "gsm.gsm_serving_cell.arfcn"},
+    {Kind::Site, "cell", "gsm.gsm_serving_cell.cell_id"},
+    {Kind::Identity, "BSIC", "gsm.gsm_serving_cell.bsic"},
+    {Kind::Channel, "ARFCN", "gsm.gsm_serving_cell.arfcn"},
 });
 constexpr auto kGsmSet = std::to_array<StatusField>({
-    {Role::Identity, "ARFCN", "gsm.gsm_set.arfcn"},
-    {Role::Identity, "BSIC", "gsm.gsm_set.bsic"},
+    {Kind::Identity, "ARFCN", "gsm.gsm_set.arfcn"},
+    {Kind::Identity, "BSIC", "gsm.gsm_set.bsic"},
 });
 constexpr auto kGsmLists = std::to_array<StatusList>({
     {"RSSI", "gsm.gsm_set.rssi", kGsmSet},
 });
 constexpr auto kUmts = std::to_array<StatusField>({
-    {Role::Site, "cell", "gsm.umts_rr_info.cell_id"},
-    {Role::Identity, "PSC", "gsm.umts_rr_info.scrambling_code"},
-    {Role::Channel, "UARFCN", "gsm.umts_rr_info.uarfcn"},
-    {Role::Channel, "UARFCN", "gsm.umts_rr_info.downlink_frequency"},
+    {Kind::Site, "cell", "gsm.umts_rr_info.cell_id"},
+    {Kind::Identity, "PSC", "gsm.umts_rr_info.scrambling_code"},
+    {Kind::Channel, "UARFCN", "gsm.umts_rr_info.uarfcn"},
+    {Kind::Channel, "UARFCN", "gsm.umts_rr_info.downlink_frequency"},
 });
 constexpr auto kActiveSet = std::to_array<StatusField>({
-    {Role::Identity, "PSC", "gsm.active_set.scrambling_code"},
+    {Kind::Identity, "PSC", "gsm.active_set.scrambling_code"},
 });
 constexpr auto kUmtsSet = std::to_array<StatusField>({
-    {Role::Identity, "PSC", "gsm.umts_set.scrambling_code"},
-    {Role::Identity, "UARFCN", "gsm.umts_set.uarfcn"},
-    {Role::Identity, "UARFCN", "gsm.umts_set.downlink_frequency"},
+    {Kind::Identity, "PSC", "gsm.umts_set.scrambling_code"},
+    {Kind::Identity, "UARFCN", "gsm.umts_set.uarfcn"},
+    {Kind::Identity, "UARFCN", "gsm.umts_set.downlink_frequency"},
 });
 constexpr auto kUmtsLists = std::to_array<StatusList>({
     {"RSCP", "gsm.active_set.rscp", kActiveSet},
@@ -69,59 +69,59 @@ constexpr auto kUmtsLists = std::to_array<StatusList>({
 });
 
 constexpr auto kUtran = std::to_array<StatusField>({
-    {Role::Site, "cell", "utran.serving_cell_info.cell_id"},
-    {Role::Identity, "PSC", "utran.serving_cell_info.cell_scrambling_code"},
-    {Role::Identity, "LAC", "utran.serving_cell_info.local_area_code"},
-    {Role::Channel, "UARFCN", "utran.serving_cell_info.downlink_uarfcn"},
-    {Role::Band, "band", "utran.serving_cell_info.freq_band_indicator"},
+    {Kind::Site, "cell", "utran.serving_cell_info.cell_id"},
+    {Kind::Identity, "PSC", "utran.serving_cell_info.cell_scrambling_code"},
+    {Kind::Identity, "LAC", "utran.serving_cell_info.local_area_code"},
+    {Kind::Channel, "UARFCN", "utran.serving_cell_info.downlink_uarfcn"},
+    {Kind::Band, "band", "utran.serving_cell_info.freq_band_indicator"},
 });
 constexpr auto kUtranSet = std::to_array<StatusField>({
-    {Role::Identity, "PSC", "utran.neighbor_cell_list.cell_id"},
-    {Role::Identity, "UARFCN", "utran.neighbor_cell_list.uarfcn"},
+    {Kind::Identity, "PSC", "utran.neighbor_cell_list.cell_id"},
+    {Kind::Identity, "UARFCN", "utran.neighbor_cell_list.uarfcn"},
 });
 constexpr auto kUtranLists = std::to_array<StatusList>({
     {"RSCP", "utran.neighbor_cell_list.filter_rscp", kUtranSet},
 });
 
 constexpr auto kOneX = std::to_array<StatusField>({
-    {Role::Identity, "SID", "cdma.system_identity.system_id"},
-    {Role::Identity, "NID", "cdma.system_identity.network_id"},
-    {Role::Identity, "base station", "cdma.system_identity.base_station_id"},
-    {Role::Channel, "channel", "cdma.1x_receiver_0.channel"},
-    {Role::Band, "band class", "cdma.1x_receiver_0.band_class"},
-    {Role::Level, "AGC", "cdma.1x_receiver_0.agc"},
+    {Kind::Identity, "SID", "cdma.system_identity.system_id"},
+    {Kind::Identity, "NID", "cdma.system_identity.network_id"},
+    {Kind::Identity, "base station", "cdma.system_identity.base_station_id"},
+    {Kind::Channel, "channel", "cdma.1x_receiver_0.channel"},
+    {Kind::Band, "band class", "cdma.1x_receiver_0.band_class"},
+    {Kind::Level, "AGC", "cdma.1x_receiver_0.agc"},
 });
 constexpr auto kOneXLists = std::to_array<StatusList>({
     {"Ec/Io", "cdma.1x.active_set", {}, "(ref pilot)"},
 });
 constexpr auto kEvdo = std::to_array<StatusField>({
-    {Role::Identity, "PN", "cdma.ev_do.serving_pn_offset"},
-    {Role::Channel, "channel", "cdma.ev_do.channel"},
-    {Role::Band, "band class", "cdma.ev_do.band_class"},
-    {Role::Level, "AGC", "cdma.ev_do.receive_agc_0"},
+    {Kind::Identity, "PN", "cdma.ev_do.serving_pn_offset"},
+    {Kind::Channel, "channel", "cdma.ev_do.channel"},
+    {Kind::Band, "band class", "cdma.ev_do.band_class"},
+    {Kind::Level, "AGC", "cdma.ev_do.receive_agc_0"},
 });
 constexpr auto kEvdoLists = std::to_array<StatusList>({
     {"Ec/Io", "cdma.ev_do.active_set", {}},
 });
 
 constexpr auto kIfx = std::to_array<StatusField>({
-    {Role::Site, "cell", "ifx.serving_cell.area.cell_id"},
-    {Role::Site, "cell", "ifx.serving_cell.cell_id"},
-    {Role::Identity, "BSIC", "ifx.serving_cell.bsic"},
-    {Role::Identity, "LAC", "ifx.serving_cell.area.lac"},
-    {Role::Identity, "LAC", "ifx.serving_cell.lac"},
-    {Role::Channel, "ARFCN", "ifx.serving_cell.arfcn"},
-    {Role::Level, "RxLev", "ifx.serving_cell.rx_level"},
+    {Kind::Site, "cell", "ifx.serving_cell.area.cell_id"},
+    {Kind::Site, "cell", "ifx.serving_cell.cell_id"},
+    {Kind::Identity, "BSIC", "ifx.serving_cell.bsic"},
+    {Kind::Identity, "LAC", "ifx.serving_cell.area.lac"},
+    {Kind::Identity, "LAC", "ifx.serving_cell.lac"},
+    {Kind::Channel, "ARFCN", "ifx.serving_cell.arfcn"},
+    {Kind::Level, "RxLev", "ifx.serving_cell.rx_level"},
 });
 constexpr auto kIfxNeighbours = std::to_array<StatusField>({
-    {Role::Identity, "ARFCN", "ifx.neighbour_cells.arfcn"},
-    {Role::Identity, "BSIC", "ifx.neighbour_cells.bsic"},
+    {Kind::Identity, "ARFCN", "ifx.neighbour_cells.arfcn"},
+    {Kind::Identity, "BSIC", "ifx.neighbour_cells.bsic"},
 });
 constexpr auto kIfxLists = std::to_array<StatusList>({
     {"RxLev", "ifx.neighbour_cells.rx_level", kIfxNeighbours},
 });
 
-constexpr auto kCells = std::to_array<StatusCellFields>({
+constexpr auto kStatusCells = std::to_array<StatusCellFields>({
     {"ifx", "GSM", RadioSystem::Gsm, kIfx, kIfxLists},
     {"gsm", "GSM", RadioSystem::Gsm, kGsm, kGsmLists},
     {"gsm", "UMTS", RadioSystem::UmtsFdd, kUmts, kUmtsLists},
@@ -169,7 +169,7 @@ constexpr auto kRunning = std::to_array<std::string_view>({
 } // namespace
 
 std::span<const StatusCellFields> statusCells() {
-    return kCells;
+    return kStatusCells;
 }
 
 std::span<const StatusNetworkFields> statusNetworks() {
