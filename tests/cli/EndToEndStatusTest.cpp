@@ -243,10 +243,14 @@ TEST_F(EndToEndStatus, OfConditions) {
     ends({{"decode", "--where", "tme > 1", sample, sample}, 2, sentence});
     ends({{"decode", "--jobs", "1", "--where", "tme > 1", sample, sample}, 2, sentence});
     ends({{"events", "--where", "tme > 1", sample, sample}, 2, sentence});
-    const std::string profile = "quality('x', packet, 'unknown') is null";
+    const std::string profile =
+        "quality('lte.serving_cell_measurements.measured_rsrp', packet, 'unknown') is null";
     const std::string failure = "pallax: --where: there is no profile \"unknown\"\n";
     ends({{"decode", "--where", profile, sample}, 1, failure});
-    ends({{"decode", "--where", "quality('x', time, 'android') is null", sample}, 0, ""});
+    ends({{"decode", "--where", "quality('gsm.serving_cell_info.rssi', 1, 'android') is null or 1",
+           sample},
+          0,
+          ""});
 }
 
 TEST_F(EndToEndStatus, OfStatus) {

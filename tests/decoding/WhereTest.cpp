@@ -179,11 +179,15 @@ TEST_F(WhereTest, AWrongConditionIsOneSentenceAndEndsTheCommand) {
 
 TEST_F(WhereTest, AValueThatCannotBeComputedEndsTheCommand) {
     add("a.pcap", kCells);
-    EXPECT_THROW((void)decoded("quality('x', packet, 'unknown') is null"), ConditionFailure);
+    EXPECT_THROW(
+        (void)decoded(
+            "quality('lte.serving_cell_measurements.measured_rsrp', packet, 'unknown') is null"),
+        ConditionFailure);
     add("b.pcap", kCells);
     events.recordings = {"b.pcap"};
     try {
-        (void)happened("quality('x', packet, 'unknown') is null");
+        (void)happened(
+            "quality('lte.serving_cell_measurements.measured_rsrp', packet, 'unknown') is null");
         FAIL();
     } catch (const ConditionFailure& failure) {
         EXPECT_STREQ(failure.what(), "--where: there is no profile \"unknown\"");
