@@ -31,13 +31,23 @@ void ConditionedOutput::show(const DisplayMoment& moment, const PropertyList& di
     if (_every == Every::Tick) {
         state.tick = moment.number;
     }
-    const auto holds = _condition->holds({state}, _values);
+    if (holds(state)) {
+        _output.show(moment, display);
+    }
+}
+
+void ConditionedOutput::packetDone(const DisplayMoment& moment) {
+    if (_every == Every::Packet && holds({moment.time, moment.number})) {
+        _output.packetDone(moment);
+    }
+}
+
+bool ConditionedOutput::holds(const StateMoment& moment) {
+    const auto holds = _condition->holds({moment}, _values);
     if (!holds) {
         throw ConditionFailure(holds.error());
     }
-    if (*holds) {
-        _output.show(moment, display);
-    }
+    return *holds;
 }
 
 } // namespace pallax

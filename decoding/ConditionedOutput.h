@@ -42,8 +42,11 @@ public:
     void beginRecording() override { _output.beginRecording(); }
     /// Throws ConditionFailure.
     void show(const DisplayMoment& moment, const PropertyList& display) override;
+    void packetDone(const DisplayMoment& moment) override;
 
 private:
+    bool holds(const StateMoment& moment);
+
     ConditionedOutput(DisplayOutput& output, const Request& request, const Resources& resources)
         : _output(output), _every(request.every), _fields(request.technology, resources),
           _values(_fields, _entries) {}

@@ -53,6 +53,22 @@ TEST_F(WideOutputTest, AnEntryHasItsColumnWhereverItStandsInTheList) {
                        "a.pcap,2023-11-14T22:13:23.000Z,2,-98.25,-98.25\n");
 }
 
+TEST_F(WideOutputTest, AConditionChoosesItsRows) {
+    add("a.pcap", {{seconds(0), neighbors({275})},
+                   {seconds(3), textOf(Record(0xB0C2).padTo(38).bytes())},
+                   {seconds(8), neighbors({9})}});
+    options.select = {"lte.serving_cell_info.download_bandwidth"};
+    options.where = "lte.serving_cell_info.download_bandwidth = 'Unknown' and packet <> 3";
+    options.every = Every::Packet;
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "time,packet,lte.serving_cell_info.download_bandwidth\n"
+                       "2023-11-14T22:13:23.000Z,2,Unknown\n");
+    options.every = Every::Tick;
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_EQ(written, "time,tick,lte.serving_cell_info.download_bandwidth\n"
+                       "2023-11-14T22:13:24.000Z,2,Unknown\n");
+}
+
 TEST_F(WideOutputTest, WhatIsOddIsToldOnce) {
     add("a.pcap",
         {{seconds(0), textOf(Record(0xFF0000).u8(1).bytes())}, {seconds(100), neighbors({275})}});
