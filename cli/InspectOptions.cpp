@@ -55,24 +55,21 @@ kept in $XDG_STATE_HOME/pallax/sql-history (by default ~/.local/state).
 The query is one statement of SQL, as SQLite has it, that only reads. "time" is
 UTC in microseconds. The tables:
 
-  packet   a row for each packet: time, packet, length, code
-  sample   each value that was read: time, packet, field, entry, raw, number,
-           text, unit
-  span     each time that a field held a value: start, packet, field, entry,
-           hold (microseconds), number, text, unit
-  state    each display tick: time, packet, tick, a column for each field that
-           is in no list, and hidden columns NAME_age in seconds
-  event    what happened: time, packet, kind, words, fields
+  packet   a row for each packet
+  sample   each value that was read
+  span     each time that a field held a value
+  state    each display tick: a column for each field that is in no list
+  event    what happened
+  cell     each cell in each of its roles
+  series   the course of a field: series(field, buckets)
   field    the fields, as in "pallax fields"
 
 and a table for each section and each list in it, with a row for each reading
-(of a list, each entry, with its identity and its place): the name of a field
+(of a list, each entry): the name of a field
 (lte.serving_cell_measurements.measured_rsrp) is technology, table and column.
-
-The functions band(technology, channel), mhz(technology, channel),
-operator(mcc, mnc), cell_site(technology, identity), quality(field, value) or
-quality(field, value, profile), time_text(time) and the aggregate
-quantile(value, weight, q) are there beside those of SQLite.
+There are functions for bands, frequencies, operators, qualities, labels and
+quantiles. The manual page pallax-sql(7) describes all of them and has recipes:
+"how did RSRP go", "what changed when the connection was lost", and more.
 
 With --live, the query is about the packets of the live modem from now until
 Ctrl-C, the end of its source, or --for. They are kept, and so are recordings

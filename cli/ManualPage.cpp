@@ -139,7 +139,8 @@ std::string seeAlso(const CommandDescription& program, const CommandDescription*
             list += ".BR pallax\\-" + each.name + " (1),\n";
         }
     }
-    return list + ".BR pallax.conf (5),\n.BR pallax\\-recording (7),\n.BR pallax\\-sections (7)\n";
+    return list + ".BR pallax.conf (5),\n.BR pallax\\-recording (7),\n.BR pallax\\-sections "
+                  "(7),\n.BR pallax\\-sql (7)\n";
 }
 
 /// "shows that" for "Pallax shows that.", because it follows the name.

@@ -129,7 +129,8 @@ TEST(ManualPage, NoPageMakesTheFormatterComplain) {
     const doubles::TemporaryFolder folder;
     std::vector<std::string> files{PALLAX_SOURCE_DIR "/docs/man/pallax.conf.5",
                                    PALLAX_SOURCE_DIR "/docs/man/pallax-recording.7",
-                                   PALLAX_SOURCE_DIR "/docs/man/pallax-sections.7"};
+                                   PALLAX_SOURCE_DIR "/docs/man/pallax-sections.7",
+                                   PALLAX_SOURCE_DIR "/docs/man/pallax-sql.7"};
     for (const std::string& name : manualPages(program())) {
         files.push_back(folder.write(name + ".1", manualPage(program(), name)));
     }
