@@ -2,8 +2,8 @@
 //
 // Prints one line for each figure, "NAME SECONDS" (processor time): a count, a sum and a maximum
 // over all samples as the tables of a timeline give them ("samples"), and over an ordinary table
-// with the same rows ("table"); up to 1,000 events with the state of the tick after each
-// ("events", and "joined", how many there were).
+// with the same rows ("table"); 1,000 buckets of the first field ("series"); up to 1,000 events
+// with the state of the tick after each ("events", and "joined", how many there were).
 
 #include "LogGenerator/Technologies/Technologies.h"
 #include "bench/ProcessorTime.h"
@@ -27,6 +27,8 @@ namespace {
 using namespace pallax;
 
 constexpr const char* kAggregate = "select count(*), sum(number), max(time) from sample";
+constexpr const char* kSeries =
+    "select count(*), sum(max - min) from series((select field from sample limit 1), 1000)";
 constexpr const char* kEvents =
     "select e.time, e.words, s.* from (select * from event limit 1000) e "
     "join state s on s.time >= e.time and s.time < e.time + 2000000";
@@ -127,6 +129,9 @@ int main(int argc, char** argv) {
     run(database, kAggregate,
         [&](const std::vector<QueryValue>& row) { samples = std::get<std::int64_t>(row[0]); });
     (void)std::printf("samples %.5f\n", processorSeconds() - start);
+    start = processorSeconds();
+    run(database, kSeries, [](const std::vector<QueryValue>& /*row*/) {});
+    (void)std::printf("series %.5f\n", processorSeconds() - start);
     start = processorSeconds();
     const std::uint64_t joined =
         run(database, kEvents, [](const std::vector<QueryValue>& /*row*/) {});

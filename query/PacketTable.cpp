@@ -34,6 +34,9 @@ public:
         _packet = *packet;
         return true;
     }
+    std::int64_t number(std::int64_t /*place*/) const override {
+        return static_cast<std::int64_t>(_packet.number);
+    }
     void give(std::size_t column, ColumnValue& value) const override {
         switch (column) {
         case kTime:

@@ -62,6 +62,10 @@ public:
     virtual bool next() = 0;
     /// Gives the value of a column of the current row, by its place in the table's columns.
     virtual void give(std::size_t column, ColumnValue& value) const = 0;
+    /// A number that the current row alone has, and has with any bounds: SQLite knows by it which
+    /// rows it has already had when conditions are joined by OR. `place`, among these rows from 1
+    /// on, is one only if the table takes no bounds.
+    virtual std::int64_t number(std::int64_t place) const { return place; }
 };
 
 /// A table over what is already there.

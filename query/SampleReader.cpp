@@ -29,14 +29,16 @@ bool SampleReader::readMore() {
             break;
         }
         _packet = *packet;
+        _place = 0;
         _replay->update(*packet, &_values);
     }
     return !_items.empty() || !_gone.empty() || _replay;
 }
 
 void SampleReader::valueRead(FieldIndex field, EntryId entry, const FieldValue& value) {
+    const std::uint32_t place = _place++;
     if (!_field || *_field == field) {
-        _items.push_back({_packet.number, _packet.time, field, entry, value});
+        _items.push_back({_packet.number, _packet.time, field, entry, value, place});
     }
 }
 

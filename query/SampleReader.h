@@ -20,7 +20,15 @@ public:
         FieldIndex field;
         EntryId entry; ///< kNoEntry outside lists
         FieldValue value;
+        std::uint32_t place; ///< among all samples of the packet
+
+        std::int64_t number() const { return numberInPacket(packet, place); }
     };
+    /// A number that something in a packet alone has, by its place in it.
+    static std::int64_t numberInPacket(std::uint64_t packet, std::uint64_t place) {
+        constexpr unsigned kPlaceBits = 24;
+        return static_cast<std::int64_t>(packet << kPlaceBits | place);
+    }
     /// A list that begins anew, or a field that is gone, before the item with that index.
     struct Gone {
         std::size_t before;
@@ -54,6 +62,7 @@ private:
     std::unique_ptr<PacketReader> _reader;
     CurrentValues _values;
     JournalPacket _packet;
+    std::uint32_t _place = 0;
     std::vector<Item> _items;
     std::vector<Gone> _gone;
 };

@@ -39,6 +39,9 @@ public:
         }
         return true;
     }
+    std::int64_t number(std::int64_t /*place*/) const override {
+        return _reader.items()[_place].number();
+    }
     void give(std::size_t column, ColumnValue& value) const override {
         const SampleReader::Item& item = _reader.items()[_place];
         switch (column) {

@@ -61,6 +61,9 @@ public:
         }
     }
 
+    std::int64_t number(std::int64_t /*place*/) const override {
+        return SampleReader::numberInPacket(_packet, _place);
+    }
     void give(std::size_t column, ColumnValue& value) const override {
         switch (column) {
         case kTime:

@@ -51,6 +51,7 @@ public:
     SeriesRows(const Timeline& timeline, std::string field, std::int64_t buckets,
                std::vector<EntryBuckets> entries)
         : _timeline(timeline), _field(std::move(field)), _buckets(buckets),
+          _call(std::hash<std::string>()(_field + "," + std::to_string(buckets))),
           _entries(std::move(entries)) {}
 
     bool next() override {
@@ -65,6 +66,12 @@ public:
             }
         }
         return false;
+    }
+    std::int64_t number(std::int64_t /*place*/) const override {
+        constexpr unsigned kEntryAndBucket = 32;
+        constexpr unsigned kBucketBits = 16;
+        return static_cast<std::int64_t>(_call << kEntryAndBucket | _entry << kBucketBits |
+                                         _bucket);
     }
     void give(std::size_t column, ColumnValue& value) const override {
         const Bucket& bucket = _entries[_entry].buckets[_bucket];
@@ -116,6 +123,7 @@ private:
     const Timeline& _timeline;
     std::string _field; ///< as the query names it
     std::int64_t _buckets;
+    std::uint64_t _call; ///< other arguments have other numbers
     std::vector<EntryBuckets> _entries;
     std::size_t _entry = 0;
     std::size_t _bucket = 0;

@@ -45,6 +45,9 @@ public:
         }
         return true;
     }
+    std::int64_t number(std::int64_t /*place*/) const override {
+        return _ended.front().begin.number();
+    }
     void give(std::size_t column, ColumnValue& value) const override {
         const Span& span = _ended.front();
         switch (column) {

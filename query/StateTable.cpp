@@ -15,17 +15,23 @@ namespace {
 /// The ticks and the values at them, decoded from a key frame on.
 class StateRows final : public Rows {
 public:
-    StateRows(Timeline& timeline, const PacketRange& range, const StateColumns& columns)
-        : _timeline(timeline), _range(range), _columns(columns),
+    /// `near` is a key frame close to the rows that were asked for last, and becomes one close to
+    /// these: a join asks for the rows at one time after the other.
+    StateRows(Timeline& timeline, const PacketRange& range, const StateColumns& columns,
+              std::optional<TimelineKeyFrame>& near)
+        : _timeline(timeline), _range(range), _columns(columns), _near(near),
           _values(timeline.fieldTable(), timeline.entryTable()) {
         if (range.first > range.last) {
             return;
         }
-        const TimelineKeyFrame& from = *timeline.keyFrames().atOrBefore(range.first - 1);
+        const TimelineKeyFrame& kept = *timeline.keyFrames().atOrBefore(range.first - 1);
+        const bool isNearer = near && near->packet < range.first && near->packet > kept.packet;
+        const TimelineKeyFrame& from = isNearer ? *near : kept;
         _values.take(from.values);
         _grid = from.grid;
         _shown = from.ticks.empty() ? 0 : from.ticks.back().packet;
-        _replay = timeline.replayAt(from.packet);
+        _noteFrom = std::max(range.first, from.packet + kNoteEvery);
+        _replay = timeline.replayFrom(from);
         _reader = timeline.journal().reader(from.packet + 1);
     }
 
@@ -39,6 +45,9 @@ public:
                 _held.reset();
                 return end();
             }
+            if (_held->number == _noteFrom) {
+                note();
+            }
             const auto passed = _grid.passedBefore(_held->time);
             if (passed && show(*passed)) {
                 return true;
@@ -50,11 +59,25 @@ public:
         return false;
     }
 
+    std::int64_t number(std::int64_t /*place*/) const override {
+        return static_cast<std::int64_t>(_shown);
+    }
     void give(std::size_t column, ColumnValue& value) const override {
         _columns.give(column, {_tick.time, _shown, _tick.number}, _values, value);
     }
 
 private:
+    /// A key frame takes as long as reading so many packets.
+    static constexpr std::uint64_t kNoteEvery = 128;
+
+    void note() {
+        std::vector<ShownTick> ticks;
+        if (_shown != 0) {
+            ticks.push_back({_tick, _shown});
+        }
+        _near = TimelineKeyFrame{
+            _replay->packet(), _replay->keyFrame(), _values, _grid, std::move(ticks), {}};
+    }
     /// The tick after the last packet, if it has new data.
     bool end() {
         const bool isShown = _replay->packet() > 0 && show(_grid.next());
@@ -75,6 +98,8 @@ private:
     Timeline& _timeline;
     PacketRange _range;
     const StateColumns& _columns;
+    std::optional<TimelineKeyFrame>& _near;
+    std::uint64_t _noteFrom = 0;     ///< the packet before which it is taken
     std::unique_ptr<Replay> _replay; ///< null after the last row
     std::unique_ptr<PacketReader> _reader;
     std::optional<JournalPacket> _held; ///< comes after the current tick
@@ -94,7 +119,7 @@ public:
         return static_cast<double>(_timeline.packets()) / kPacketsPerTick;
     }
     std::unique_ptr<Rows> rows(const RowBounds& bounds) override {
-        return std::make_unique<StateRows>(_timeline, ticksIn(bounds), _columns);
+        return std::make_unique<StateRows>(_timeline, ticksIn(bounds), _columns, _near);
     }
 
 private:
@@ -110,6 +135,7 @@ private:
 
     Timeline& _timeline;
     StateColumns _columns;
+    std::optional<TimelineKeyFrame> _near;
 };
 
 } // namespace

@@ -264,7 +264,8 @@ int column(sqlite3_vtab_cursor* cursor, sqlite3_context* context, int index) {
 }
 
 int rowNumber(sqlite3_vtab_cursor* cursor, sqlite3_int64* number) {
-    *number = static_cast<Cursor*>(cursor)->number;
+    const auto& at = *static_cast<Cursor*>(cursor);
+    *number = at.rows->number(at.number);
     return SQLITE_OK;
 }
 

@@ -113,9 +113,14 @@ std::unique_ptr<Replay> Timeline::replayAt(std::uint64_t instant) {
     if (from == nullptr) {
         throw std::out_of_range("the journal no longer has this instant");
     }
-    auto replay = std::make_unique<Replay>(_source);
-    replay->resume(from->decoder, from->packet);
+    auto replay = replayFrom(*from);
     advance(*replay, instant);
+    return replay;
+}
+
+std::unique_ptr<Replay> Timeline::replayFrom(const TimelineKeyFrame& from) const {
+    auto replay = std::make_unique<Replay>(_source);
+    replay->resume(from.decoder, from.packet);
     return replay;
 }
 

@@ -63,6 +63,18 @@ TEST_P(BoundsTest, AFieldIsLookedForByItsName) {
               std::vector<std::string>{"0"});
 }
 
+TEST_P(BoundsTest, JoinedByOrLeaveNothingOut) {
+    EXPECT_EQ(_fixture.ask("select packet from packet where packet = 3 or packet = 5 or packet "
+                           "between 7 and 8"),
+              (std::vector<std::string>{"3", "5", "7", "8"}));
+    for (const char* table : {"sample", "state"}) {
+        const std::string select = std::string("select count(*) from ") + table + " where ";
+        EXPECT_EQ(_fixture.ask(select + "packet < 50 or packet > 60"),
+                  _fixture.ask(select + "+packet < 50 or +packet > 60"))
+            << table;
+    }
+}
+
 TEST(TimesThatComeTwice, AreFoundInBothStretches) {
     QueryFixture fixture("lte", 3, std::chrono::seconds(10));
     TimelineFixture twice("lte");
