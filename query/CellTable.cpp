@@ -99,15 +99,17 @@ public:
         constexpr double kSome = 100;
         return kSome;
     }
-    std::unique_ptr<Rows> rows(const RowBounds& /*bounds*/) override {
+    std::unique_ptr<Rows> rows(const RowBounds& bounds) override {
         if (!_cells || _packets != _timeline.packets()) {
-            _packets = _timeline.packets();
+            RowBounds all;
+            all.mayContinue = bounds.mayContinue;
             CellFinder finder(_timeline);
-            SampleReader reader(_timeline, packetsIn(_timeline, RowBounds{}));
+            SampleReader reader(_timeline, packetsIn(_timeline, all));
             while (reader.readMore()) {
                 finder.take(reader.items());
             }
             _cells = std::make_shared<const std::vector<FoundCell>>(std::move(finder).found());
+            _packets = _timeline.packets();
         }
         return std::make_unique<CellRows>(_cells);
     }

@@ -57,7 +57,7 @@ QueryError errorOf(sqlite3& connection) {
     const int place = sqlite3_error_offset(&connection);
     const int code = sqlite3_errcode(&connection);
     std::string sentence = code == SQLITE_AUTH        ? kOnlyReading
-                           : code == SQLITE_INTERRUPT ? "The query was stopped."
+                           : code == SQLITE_INTERRUPT ? kStopped
                            : code == SQLITE_NOMEM ? "The query needs more than 512 MiB of memory."
                                                   : sqlite3_errmsg(&connection);
     return {std::move(sentence),
@@ -232,6 +232,7 @@ void Database::addFunction(const char* name, int arguments, Function function) {
 
 void Database::setMayContinue(std::function<bool()> mayContinue) {
     _mayContinue = std::move(mayContinue);
+    _authority->mayContinue = _mayContinue ? &_mayContinue : nullptr;
     sqlite3_progress_handler(_connection.get(), _mayContinue ? kStepsBetweenQuestions : 0,
                              askWhetherToStop, &_mayContinue);
 }

@@ -29,6 +29,9 @@ struct QueryError {
     std::optional<std::size_t> place; ///< in the text of the query, in bytes
 };
 
+/// The error of a query that was asked to stop.
+inline constexpr const char* kStopped = "The query was stopped.";
+
 /// A value of a result: NULL, an integer, a real number, or a text. Bytes come as a text of
 /// hexadecimal digits, as of hex().
 using QueryValue = std::variant<std::monostate, std::int64_t, double, std::string>;

@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <limits>
 #include <memory>
 #include <optional>
@@ -39,6 +40,8 @@ struct RowBounds {
     std::int64_t mostTime = std::numeric_limits<std::int64_t>::max();
     std::optional<std::string> field = std::nullopt;
     std::optional<std::int64_t> count = std::nullopt;
+    /// Asked during long work, if there is one; false stops the query.
+    const std::function<bool()>* mayContinue = nullptr;
 };
 
 /// Takes the value of one column. What is not given is NULL.

@@ -11,7 +11,7 @@ constexpr std::size_t kItemsAtOnce = 512;
 
 SampleReader::SampleReader(Timeline& timeline, const PacketRange& range,
                            std::optional<FieldIndex> field)
-    : _last(range.last), _field(field), _values(timeline.fieldTable(), timeline.entryTable()) {
+    : _range(range), _field(field), _values(timeline.fieldTable(), timeline.entryTable()) {
     _values.setListener(this);
     if (range.first <= range.last) {
         _replay = timeline.replayAt(range.first - 1);
@@ -24,10 +24,11 @@ bool SampleReader::readMore() {
     _gone.clear();
     while (_replay && _items.size() + _gone.size() < kItemsAtOnce) {
         const auto packet = _reader->next();
-        if (!packet || packet->number > _last) {
+        if (!packet || packet->number > _range.last) {
             _replay.reset();
             break;
         }
+        _range.noteRead(packet->number);
         _packet = *packet;
         _place = 0;
         _replay->update(*packet, &_values);

@@ -56,7 +56,7 @@ private:
         _gone.push_back({_items.size(), _packet.number, _packet.time, std::nullopt, list});
     }
 
-    std::uint64_t _last;
+    PacketRange _range;
     std::optional<FieldIndex> _field;
     std::unique_ptr<Replay> _replay; ///< null if there is nothing to read
     std::unique_ptr<PacketReader> _reader;

@@ -22,7 +22,8 @@ struct FieldGroup {
 /// All fields in their groups.
 std::vector<FieldGroup> fieldGroups(const FieldTable& fields);
 
-/// A row for each reading of the group: of a list, for each entry.
+/// A row for each reading of the group: of a list, for each entry. A list that is read without
+/// entries therefore has no row. Lists that the display hides are there, too.
 std::unique_ptr<QueryTable> sectionTable(Timeline& timeline, FieldGroup group);
 
 } // namespace pallax

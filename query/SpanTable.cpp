@@ -176,7 +176,9 @@ public:
     const std::vector<Column>& columns() const override { return spanColumns(); }
     double expectedRows() const override { return static_cast<double>(_timeline.packets()); }
     std::unique_ptr<Rows> rows(const RowBounds& bounds) override {
-        PacketRange range = packetsIn(_timeline, RowBounds{});
+        RowBounds all;
+        all.mayContinue = bounds.mayContinue;
+        PacketRange range = packetsIn(_timeline, all);
         std::optional<FieldIndex> field;
         if (bounds.field) {
             field = _timeline.fields().named(*bounds.field);

@@ -45,6 +45,7 @@ public:
                 _held.reset();
                 return end();
             }
+            _range.noteRead(_held->number);
             if (_held->number == _noteFrom) {
                 note();
             }

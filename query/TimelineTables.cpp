@@ -17,6 +17,7 @@
 #include <algorithm>
 #include <chrono>
 #include <cmath>
+#include <stdexcept>
 
 namespace pallax {
 
@@ -73,6 +74,13 @@ std::int64_t microseconds(Time time) {
     return std::chrono::floor<std::chrono::microseconds>(time.time_since_epoch()).count();
 }
 
+void PacketRange::noteRead(std::uint64_t packet) const {
+    constexpr std::uint64_t kAskEvery = 1024;
+    if (mayContinue != nullptr && packet % kAskEvery == 0 && !(*mayContinue)()) {
+        throw std::runtime_error(kStopped);
+    }
+}
+
 PacketRange packetsIn(const Timeline& timeline, const RowBounds& bounds) {
     PacketRange range{std::max(bounds.firstPacket, timeline.firstInstant() + 1),
                       std::min(bounds.lastPacket, timeline.packets())};
@@ -101,7 +109,8 @@ PacketRange packetsIn(const Timeline& timeline, const RowBounds& bounds) {
                                                   ? timeline.instantAt(most).value_or(end)
                                                   : end);
     }
-    return {std::max(range.first, reached.first), std::min(range.last, reached.last)};
+    return {std::max(range.first, reached.first), std::min(range.last, reached.last),
+            bounds.mayContinue};
 }
 
 std::string lastWordOf(const std::string& name) {

@@ -38,6 +38,10 @@ std::int64_t microseconds(Time time);
 struct PacketRange {
     std::uint64_t first = 1;
     std::uint64_t last = 0;
+    const std::function<bool()>* mayContinue = nullptr; ///< RowBounds
+
+    /// Called with each packet that is read: asks now and then, and throws to stop the query.
+    void noteRead(std::uint64_t packet) const;
 };
 /// The packets that the bounds leave.
 PacketRange packetsIn(const Timeline& timeline, const RowBounds& bounds);

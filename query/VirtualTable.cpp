@@ -27,6 +27,7 @@ namespace {
 /// SQLite knows only the bases, which therefore come first.
 struct OpenTable : sqlite3_vtab {
     QueryTable* table = nullptr;
+    const Authority* authority = nullptr;
 };
 struct Cursor : sqlite3_vtab_cursor {
     std::unique_ptr<Rows> rows;
@@ -62,6 +63,7 @@ int connect(sqlite3* connection, void* data, int /*count*/, const char* const* /
     auto open = std::make_unique<OpenTable>();
     const AddedTable& added = *static_cast<AddedTable*>(data);
     open->table = &added.table;
+    open->authority = &added.authority;
     added.authority.isDeclaring = true;
     const int result = sqlite3_declare_vtab(connection, declarationOf(added.table).c_str());
     added.authority.isDeclaring = false;
@@ -235,13 +237,15 @@ int advance(Cursor& cursor) {
 int filter(sqlite3_vtab_cursor* opened, int /*number*/, const char* plan, int count,
            sqlite3_value** values) {
     auto& cursor = *static_cast<Cursor*>(opened);
+    const OpenTable& open = *static_cast<OpenTable*>(opened->pVtab);
     RowBounds bounds;
+    bounds.mayContinue = open.authority->mayContinue;
     for (int index = 0; index < count; ++index) {
         const char* const step = plan + std::ptrdiff_t{2} * index;
         bound(bounds, step[0], step[1], values[index]);
     }
     try {
-        cursor.rows = static_cast<OpenTable*>(opened->pVtab)->table->rows(bounds);
+        cursor.rows = open.table->rows(bounds);
     } catch (const std::exception& error) {
         return fail(*opened->pVtab, error);
     }

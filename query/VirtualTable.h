@@ -1,5 +1,7 @@
 #pragma once
 
+#include <functional>
+
 struct sqlite3;
 
 namespace pallax {
@@ -10,7 +12,8 @@ class QueryTable;
 struct Authority {
     /// Set while SQLite reads a table's own declaration, which writes to no file.
     bool isDeclaring = false;
-    bool hasRefused = false; ///< since it was last set to false
+    bool hasRefused = false;                            ///< since it was last set to false
+    const std::function<bool()>* mayContinue = nullptr; ///< RowBounds
 };
 
 /// A table of a connection.

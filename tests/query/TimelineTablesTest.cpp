@@ -211,6 +211,24 @@ TEST_F(LteTablesTest, AgesCountFromTheLatestReading) {
               Lines{"0"});
 }
 
+TEST(QueriesWithoutRows, CanBeStoppedToo) {
+    QueryFixture fixture("lte", 7, std::chrono::seconds(60));
+    ASSERT_GT(fixture.timeline->packets(), 2048U);
+    int asked = 0;
+    fixture.database.setMayContinue([&] { return ++asked < 2; });
+    for (const char* table :
+         {"cell", "sample where field = 'lte.serving_cell_info.cell_identity' and number < 0",
+          "span where field = 'lte.serving_cell_info.cell_identity' and number < 0", "sim_info"}) {
+        asked = 0;
+        EXPECT_EQ(fixture.ask(std::string("select count(*) from ") + table),
+                  Lines{"The query was stopped."})
+            << table;
+        EXPECT_EQ(asked, 2) << table;
+    }
+    fixture.database.setMayContinue({});
+    EXPECT_NE(fixture.ask("select count(*) from cell"), Lines{"0"});
+}
+
 TEST(QuestionsOfAnEmptyRecording, HaveNoRows) {
     QueryFixture fixture("lte", 1, std::chrono::seconds(0));
     for (const char* table : {"packet", "sample", "span", "state", "event"}) {
