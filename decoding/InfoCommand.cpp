@@ -34,25 +34,21 @@ ExitStatus InfoCommand::describe(const PartPaths& parts, Output& output) {
         _environment.report(recording.error().sentence);
         return kExitFailure;
     }
-    return (*recording)->technology() == &kSnapshotTechnology
-               ? describeSnapshot(parts.front(), output)
-               : describe(**recording, output);
+    if (const Snapshot* snapshot = snapshotOf(**recording)) {
+        describe(*snapshot, (*recording)->name(), output);
+        return kExitSuccess;
+    }
+    return describe(**recording, output);
 }
 
-ExitStatus InfoCommand::describeSnapshot(const std::string& path, Output& output) {
-    const auto snapshot = readSnapshot(path);
-    if (!snapshot) {
-        _environment.report(path + " is no longer a snapshot.");
-        return kExitFailure;
-    }
+void InfoCommand::describe(const Snapshot& snapshot, const std::string& name, Output& output) {
     if (_options.json) {
-        appendSnapshotJson(output.text(), path, *snapshot);
+        appendSnapshotJson(output.text(), name, snapshot);
     } else {
         separate(output);
-        appendSnapshotText(output.text(), path, *snapshot);
+        appendSnapshotText(output.text(), name, snapshot);
     }
     output.lineDone();
-    return kExitSuccess;
 }
 
 /// Begins the text of a file.

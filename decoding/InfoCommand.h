@@ -16,6 +16,7 @@ namespace pallax {
 
 class Output;
 class Resources;
+struct Snapshot;
 
 /// `pallax info`: what recordings hold.
 struct InfoOptions {
@@ -43,7 +44,7 @@ public:
 private:
     ExitStatus describe(const PartPaths& parts, Output& output);
     ExitStatus describe(Recording& recording, Output& output);
-    ExitStatus describeSnapshot(const std::string& path, Output& output);
+    void describe(const Snapshot& snapshot, const std::string& name, Output& output);
     void separate(Output& output);
     /// Null for an unknown technology.
     const RecordingSummary::Codes* codesOf(const RecordedTechnology* technology);

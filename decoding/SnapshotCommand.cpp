@@ -5,8 +5,8 @@
 #include "host/Complaint.h"
 #include "host/Descriptor.h"
 #include "host/Files.h"
+#include "host/Recording.h"
 #include "host/Snapshot.h"
-#include "plist/PropertyListCodec.h"
 #include "text/Format.h"
 
 #include <fcntl.h>
@@ -37,7 +37,7 @@ ExitStatus write(const std::string& output, std::string_view content) {
             writeToDescriptor(file.number(), output)(content);
             return kExitSuccess;
         }
-    } else if (replaceFile(output, content)) {
+    } else if (replaceFile(output, content, FileMode::Usual)) {
         return kExitSuccess;
     }
     return failed(formatText("%@ cannot be written.", {output}));
@@ -53,17 +53,18 @@ ExitStatus runSnapshot(const SnapshotOptions& options) {
     if (const auto loss = outputIntoRecording({&options.file, 1})) {
         return failed(*loss);
     }
-    const auto content = readRegularFile(options.file, kLargestPropertyList);
-    if (!content) {
-        return failed(
-            formatText("%@ cannot be opened: %@.", {options.file, content.error().reason}));
+    const std::string name = options.file == "-" ? "standard input" : options.file;
+    const auto opened = Recording::openInput({options.file, {}, complain});
+    using Kind = RecordingError::Kind;
+    if (!opened && opened.error().kind != Kind::NoCapture && opened.error().kind != Kind::Empty) {
+        return failed(opened.error().sentence);
     }
-    const auto snapshot = readSnapshot(options.file);
-    if (!snapshot) {
-        return failed(options.file + " is not a snapshot.");
+    const Snapshot* snapshot = opened ? snapshotOf(**opened) : nullptr;
+    if (snapshot == nullptr) {
+        return failed(name + " is not a snapshot.");
     }
     if (snapshot->dlf == nullptr) {
-        return failed(options.file + " holds no DLF log.");
+        return failed(name + " holds no DLF log.");
     }
     if (recordingAmong({&options.file, 1}, regularFile(options.output))) {
         return failed(formatText("The DLF log would replace the snapshot %@.", {options.file}));

@@ -27,6 +27,18 @@ bool writeAll(const Descriptor& file, std::string_view content) {
     return true;
 }
 
+/// A new file of that name, whose six last letters are replaced.
+Descriptor createBeside(std::string& name, FileMode mode) {
+    Descriptor file(::mkostemp(name.data(), O_CLOEXEC));
+    if (!file || mode == FileMode::Private) {
+        return file;
+    }
+    // The umask is asked by creating a file: reading it would change it for all threads.
+    constexpr mode_t kAll = S_IRUSR | S_IWUSR | S_IRGRP | S_IWGRP | S_IROTH | S_IWOTH;
+    (void)::unlink(name.c_str());
+    return Descriptor(::open(name.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, kAll));
+}
+
 } // namespace
 
 Result<ByteBuffer, ReadFailure> readRegularFile(const std::string& path, std::size_t largest) {
@@ -80,14 +92,17 @@ bool writePrivateFile(const std::string& path, std::string_view content) {
     return isWritten;
 }
 
-bool replaceFile(const std::string& path, std::string_view content) {
+bool replaceFile(const std::string& path, std::string_view content, FileMode mode) {
     std::string temporary = path + ".XXXXXX";
-    const Descriptor file(::mkostemp(temporary.data(), O_CLOEXEC));
+    const Descriptor file = createBeside(temporary, mode);
     if (!file) {
         return false;
     }
-    const bool done = writeAll(file, content) && ::fsync(file.number()) == 0 &&
-                      std::rename(temporary.c_str(), path.c_str()) == 0;
+    struct stat before {};
+    const bool keepsMode = mode == FileMode::Usual && ::stat(path.c_str(), &before) == 0;
+    const bool done =
+        writeAll(file, content) && (!keepsMode || ::fchmod(file.number(), before.st_mode) == 0) &&
+        ::fsync(file.number()) == 0 && std::rename(temporary.c_str(), path.c_str()) == 0;
     if (!done) {
         (void)::unlink(temporary.c_str());
     }

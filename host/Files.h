@@ -26,8 +26,14 @@ std::optional<ByteBuffer> readFile(const std::string& path, std::size_t largest)
 /// device. Removes a file that cannot be written completely.
 bool writePrivateFile(const std::string& path, std::string_view content);
 
+enum class FileMode {
+    Private, ///< only its user may read it
+    Usual    ///< as a program creates files: that of the file before or, if it is new, by the umask
+};
+
 /// Replaces the file atomically: readers see the old content or the new one, even after a crash.
 /// False, with the old content in place, on failure.
-bool replaceFile(const std::string& path, std::string_view content);
+bool replaceFile(const std::string& path, std::string_view content,
+                 FileMode mode = FileMode::Private);
 
 } // namespace pallax

@@ -4,6 +4,7 @@
 #include "host/Recording.h"
 #include "host/RecordingFile.h"
 #include "host/Snapshot.h"
+#include "plist/PropertyListCodec.h"
 #include "text/Format.h"
 
 #include <pcap/pcap.h>
@@ -228,6 +229,43 @@ RecordingError noCapture(const OpenedFile& file, const std::string& name, std::s
     return errorOf(Kind::Unreadable, name, formatText("cannot be read: %@", {reason}));
 }
 
+/// Whether the content may be a snapshot: a property list in binary form or XML. No capture begins
+/// so.
+bool mayBeSnapshot(int first) {
+    constexpr int kFirstOfUtf8Mark = 0xEF;
+    return first == 'b' || first == '<' || first == kFirstOfUtf8Mark;
+}
+
+/// The rest of a content that is no larger than a property list may be.
+std::optional<ByteBuffer> restOf(std::FILE* content) {
+    ByteBuffer bytes;
+    constexpr std::size_t kPiece = std::size_t{64} << 10U;
+    for (std::size_t read = kPiece; read != 0 && bytes.size() <= kLargestPropertyList;) {
+        const std::size_t before = bytes.size();
+        bytes.resize(before + kPiece);
+        read = std::fread(bytes.data() + before, 1, kPiece, content);
+        bytes.resize(before + read);
+    }
+    return bytes.size() <= kLargestPropertyList ? std::optional(std::move(bytes)) : std::nullopt;
+}
+
+Recording::OpenResult openSnapshot(OpenedFile file, const std::string& name) {
+    constexpr std::size_t kMagicOfCapture = 4; // bytes
+    const auto content = restOf(file.content);
+    const bool isWhole = content && std::ferror(file.content) == 0 &&
+                         file.ending() == DecompressedFile::Ending::Whole;
+    auto snapshot = isWhole ? snapshotIn(*content) : std::nullopt;
+    if (content && content->size() >= kMagicOfCapture) {
+        std::clearerr(file.content); // it does not end in what would be the header of a capture
+    }
+    const RecordingError error = noCapture(file, name, "unknown file format");
+    (void)std::fclose(file.content);
+    if (!snapshot) {
+        return error;
+    }
+    return recordingOf(std::move(*snapshot), name, file.isStream);
+}
+
 Recording::OpenResult openCapture(const Recording::Input& input, const std::string& name) {
     auto opened = openFile(input, name);
     if (!opened) {
@@ -256,6 +294,9 @@ Recording::OpenResult openCapture(const Recording::Input& input, const std::stri
         return failed(isEmpty ? empty : noCapture(file, name, ""));
     }
     (void)std::ungetc(firstOfContent, file.content);
+    if (mayBeSnapshot(firstOfContent)) {
+        return openSnapshot(std::move(file), name);
+    }
     std::array<char, PCAP_ERRBUF_SIZE> reason{};
     pcap_t* capture = pcap_fopen_offline_with_tstamp_precision(
         file.content, PCAP_TSTAMP_PRECISION_NANO, reason.data());
@@ -273,13 +314,7 @@ Recording::OpenResult openCapture(const Recording::Input& input, const std::stri
 Recording::OpenResult Recording::openInput(const Input& input) {
     const std::string path = input.path == "-" ? "standard input" : input.path;
     const std::string& name = input.name.empty() ? path : input.name;
-    OpenResult capture = openCapture(input, name);
-    if (!capture && capture.error().kind == Kind::NoCapture && input.path != "-") {
-        if (auto snapshot = recordingOfSnapshot(input.path, name)) {
-            return snapshot;
-        }
-    }
-    return capture;
+    return openCapture(input, name);
 }
 
 } // namespace pallax

@@ -1,6 +1,5 @@
 #include "host/Snapshot.h"
 
-#include "host/Files.h"
 #include "plist/PropertyListCodec.h"
 #include "text/Format.h"
 #include "text/TimeText.h"
@@ -45,10 +44,12 @@ void addEntry(Snapshot& snapshot, const Dictionary& entry) {
 /// Gives a message for each display.
 class SnapshotRecording final : public Recording {
 public:
-    SnapshotRecording(std::string name, Snapshot snapshot)
-        : _name(std::move(name)), _snapshot(std::move(snapshot)) {}
+    SnapshotRecording(std::string name, Snapshot snapshot, bool isStream)
+        : _name(std::move(name)), _snapshot(std::move(snapshot)), _isStream(isStream) {}
 
+    const Snapshot& snapshot() const { return _snapshot; }
     const std::string& name() const override { return _name; }
+    bool isStream() const override { return _isStream; }
     std::string format() const override { return "snapshot"; }
     int linkType() const override { return kSnapshotTechnology.linkType; }
     const RecordedTechnology* technology() const override { return &kSnapshotTechnology; }
@@ -56,12 +57,13 @@ public:
         return {RecordingError::Kind::UnknownLinkType, _name + " is a snapshot."};
     }
     std::optional<RecordedPacket> next() override;
-    std::optional<std::uint64_t> position() const override { return 0; } // it is no stream
+    std::optional<std::uint64_t> position() const override { return 0; } // it is read as a whole
     const std::optional<RecordingError>& error() const override { return _error; }
 
 private:
     std::string _name;
     Snapshot _snapshot;
+    bool _isStream;
     std::size_t _next = 0;
     Time _time = kEarliestTime;
     ByteBuffer _message;
@@ -109,18 +111,21 @@ std::optional<Snapshot> snapshotOf(const PropertyList& object) {
     return snapshot;
 }
 
-std::optional<Snapshot> readSnapshot(const std::string& path) {
-    const auto content = readRegularFile(path, kLargestPropertyList);
-    if (!content || formOf(*content) == PropertyListForm::Text) {
+std::optional<Snapshot> snapshotIn(Bytes content) {
+    if (formOf(content) == PropertyListForm::Text) {
         return std::nullopt;
     }
-    const auto object = parsePropertyList(*content);
+    const auto object = parsePropertyList(content);
     return object ? snapshotOf(*object) : std::nullopt;
 }
 
-std::unique_ptr<Recording> recordingOfSnapshot(const std::string& path, const std::string& name) {
-    auto snapshot = readSnapshot(path);
-    return snapshot ? std::make_unique<SnapshotRecording>(name, std::move(*snapshot)) : nullptr;
+std::unique_ptr<Recording> recordingOf(Snapshot snapshot, const std::string& name, bool isStream) {
+    return std::make_unique<SnapshotRecording>(name, std::move(snapshot), isStream);
+}
+
+const Snapshot* snapshotOf(const Recording& recording) {
+    const auto* snapshot = dynamic_cast<const SnapshotRecording*>(&recording);
+    return snapshot != nullptr ? &snapshot->snapshot() : nullptr;
 }
 
 RecordingError noTimeOfSnapshot(const std::string& path) {

@@ -34,8 +34,8 @@ inline constexpr std::string_view kSharedSections =
 /// array of dictionaries. Nothing for any other object.
 std::optional<Snapshot> snapshotOf(const PropertyList& object);
 
-/// Nothing if the file is not a snapshot or cannot be read.
-std::optional<Snapshot> readSnapshot(const std::string& path);
+/// Nothing if the content of a file is not a snapshot.
+std::optional<Snapshot> snapshotIn(Bytes content);
 
 /// The technology of a snapshot that is read as a recording. Its messages, one for each display,
 /// are dictionaries with these keys.
@@ -48,7 +48,9 @@ inline constexpr const char* kSnapshotDisplay = "Display";
 /// The error for a snapshot where a recording is needed.
 RecordingError noTimeOfSnapshot(const std::string& path);
 
-/// The snapshot in a file as a recording; null if the file is not a snapshot.
-std::unique_ptr<Recording> recordingOfSnapshot(const std::string& path, const std::string& name);
+/// A snapshot as a recording. `isStream`: it has been read from a pipe.
+std::unique_ptr<Recording> recordingOf(Snapshot snapshot, const std::string& name, bool isStream);
+/// The snapshot that is read as this recording; null for any other recording.
+const Snapshot* snapshotOf(const Recording& recording);
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "host/Descriptor.h"
 #include "plist/PropertyListCodec.h"
 #include "tests/cli/EndToEndScreen.h"
+#include "tests/doubles/Compression.h"
 
 #include <algorithm>
 #include <csignal>
@@ -95,6 +96,16 @@ TEST_F(EndToEndSnapshot, ASavedOneOpens) {
     EXPECT_EQ(contentOf(world.path("log.dlf")), std::string(expected.begin(), expected.end()));
     EXPECT_EQ(run({"snapshot", "--dlf", path}).out, contentOf(world.path("log.dlf")));
 
+    // From standard input, and compressed.
+    EXPECT_EQ(run({"decode", "-"}, path).out, decoded.out);
+    EXPECT_EQ(run({"snapshot", "--dlf", "-"}, path).out, contentOf(world.path("log.dlf")));
+    std::string text = info.out;
+    text.replace(0, path.size(), "standard input");
+    EXPECT_EQ(run({"info", "-"}, path).out, text);
+    std::ofstream(path + ".gz", std::ios::binary) << doubles::gzipOf(contentOf(path));
+    EXPECT_EQ(run({"decode", path + ".gz"}).out, decoded.out);
+    EXPECT_EQ(run({"snapshot", "--dlf", path + ".gz"}).out, contentOf(world.path("log.dlf")));
+
     const Run printed = run({path, "--print"});
     EXPECT_EQ(printed.status, 0);
     EXPECT_NE(printed.out.find("\n  Note: Displays that share a section all show it as it was "),
@@ -117,6 +128,8 @@ TEST_F(EndToEndSnapshot, WhatIsNoneIsRefused) {
     const std::string path = world.path("empty.pallax");
     std::ofstream(path) << *empty;
     EXPECT_EQ(run({"snapshot", "--dlf", path}).err, "pallax: " + path + " holds no DLF log.\n");
+    EXPECT_EQ(run({"snapshot", "--dlf", "-"}, path).err,
+              "pallax: standard input holds no DLF log.\n");
     EXPECT_EQ(run({"decode", path}).out, "null\n");
     PallaxTerminal terminal(world, {"snapshot", "--dlf", path}, {});
     EXPECT_EQ(terminal.wait(), 2);

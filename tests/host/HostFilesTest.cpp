@@ -299,5 +299,37 @@ TEST(WallClock, IsTheMachinesClock) {
     EXPECT_LE(now, std::chrono::system_clock::now());
 }
 
+/// Sets the umask for a scope.
+class ScopedUmask {
+public:
+    explicit ScopedUmask(mode_t mask) : _before(::umask(mask)) {}
+    ~ScopedUmask() { (void)::umask(_before); }
+    ScopedUmask(const ScopedUmask&) = delete;
+    ScopedUmask& operator=(const ScopedUmask&) = delete;
+
+private:
+    mode_t _before;
+};
+
+TEST(ReplaceFile, HasTheUsualModeOrIsPrivate) {
+    const doubles::RuntimeFolder folder;
+    const std::string path = folder.file("new");
+    const auto modeAfter = [&path](FileMode mode) {
+        EXPECT_TRUE(replaceFile(path, "content", mode));
+        struct stat status {};
+        (void)::stat(path.c_str(), &status);
+        return status.st_mode & 07777U;
+    };
+    {
+        const ScopedUmask umask(027);
+        EXPECT_EQ(modeAfter(FileMode::Usual), 0640U);
+    }
+    ASSERT_EQ(::chmod(path.c_str(), 0604), 0);
+    EXPECT_EQ(modeAfter(FileMode::Usual), 0604U) << "that of the file before";
+    EXPECT_EQ(modeAfter(FileMode::Private), 0600U);
+    EXPECT_EQ(doubles::contentOf(path), "content");
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder.path()), {}), 1);
+}
+
 } // namespace
 } // namespace pallax

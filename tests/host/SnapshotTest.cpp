@@ -1,6 +1,7 @@
 #include "host/Snapshot.h"
 
 #include "plist/PropertyListCodec.h"
+#include "tests/doubles/Compression.h"
 #include "tests/doubles/RuntimeFolder.h"
 
 #include <gtest/gtest.h>
@@ -105,16 +106,37 @@ TEST_F(SnapshotFileTest, OpensAsARecordingWithAMessageForEachDisplay) {
     }
 }
 
+TEST_F(SnapshotFileTest, ACompressedOneOpens) {
+    for (const std::string& content :
+         {doubles::gzipOf(*serializeXml(saved())), doubles::zstdOf(*serializeXml(saved()))}) {
+        const auto opened = Recording::open(_folder.write("s.pallax.gz", content));
+        ASSERT_TRUE(opened) << opened.error().sentence;
+        ASSERT_NE(snapshotOf(**opened), nullptr);
+        EXPECT_EQ(snapshotOf(**opened)->description, "at the bridge");
+        EXPECT_TRUE((*opened)->next());
+        const std::string cut = _folder.write("cut.gz", content.substr(0, content.size() - 9));
+        EXPECT_FALSE(Recording::open(cut));
+    }
+}
+
 TEST_F(SnapshotFileTest, AnotherPropertyListIsNoRecording) {
-    for (const std::string& content : {*serializeXml(Dictionary{{"Timestamp", "now"}}),
-                                       std::string("<?xml version=\"1.0\"?><plist>"),
-                                       std::string("{ Timestamp = now; Data = (); }")}) {
+    for (const std::string& content :
+         {*serializeXml(Dictionary{{"Timestamp", "now"}}),
+          std::string("<?xml version=\"1.0\"?><plist>"), std::string("b123"),
+          std::string("bplist00"), doubles::gzipOf("<?xml version"),
+          std::string("{ Timestamp = now; Data = (); }")}) {
         const std::string path = _folder.write("r.plist", content);
         const auto opened = Recording::open(path);
         ASSERT_FALSE(opened);
         EXPECT_EQ(opened.error().sentence,
                   path + " is not a recording: it is neither pcap nor pcapng.");
     }
+}
+
+TEST_F(SnapshotFileTest, LessThanTheMarkOfACaptureEndsWithinItsHeader) {
+    const std::string path = _folder.write("r", "<p>");
+    EXPECT_EQ(Recording::open(path).error().sentence,
+              path + " is not a recording: it ends within its header.");
 }
 
 } // namespace
