@@ -27,11 +27,9 @@ bool isNumber(std::string_view text) {
 
 } // namespace
 
-TextTable::Row TextTable::printable(Row cells) {
+TextTable::Row TextTable::inOneLine(Row cells) {
     for (std::string& cell : cells) {
-        std::string escaped;
-        appendPrintable(escaped, cell);
-        cell = std::move(escaped);
+        cell = printable(cell);
     }
     return cells;
 }

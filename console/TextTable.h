@@ -10,8 +10,8 @@ namespace pallax {
 class TextTable {
 public:
     /// A row may have fewer cells than the head, but no more.
-    void setHead(std::vector<std::string> head) { _head = printable(std::move(head)); }
-    void add(std::vector<std::string> row) { _rows.push_back(printable(std::move(row))); }
+    void setHead(std::vector<std::string> head) { _head = inOneLine(std::move(head)); }
+    void add(std::vector<std::string> row) { _rows.push_back(inOneLine(std::move(row))); }
 
     /// Columns of numbers are aligned right, others left. Lines do not end with blanks.
     void appendTo(std::string& out) const;
@@ -19,7 +19,7 @@ public:
 private:
     using Row = std::vector<std::string>;
 
-    static Row printable(Row cells);
+    static Row inOneLine(Row cells);
     bool isOfNumbers(std::size_t column) const;
     std::size_t widthOf(std::size_t column) const;
 

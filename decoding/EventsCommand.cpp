@@ -15,6 +15,7 @@
 #include "host/Snapshot.h"
 #include "host/WallClock.h"
 #include "text/Format.h"
+#include "text/Printable.h"
 #include "timeline/Timeline.h"
 
 #include <memory>
@@ -108,13 +109,14 @@ private:
             appendJson(text, objectOf(event));
         } else {
             if (_form.areSeveral) {
-                text.append(_recording).append(": ");
+                appendPrintable(text, _recording);
+                text.append(": ");
             }
             constexpr std::size_t kKindWidth = 18;
             std::string kind(wordOf(event.kind));
             kind.resize(kKindWidth, ' ');
             text.append(localText(event.time, _zone)).append("  ").append(kind);
-            text.append(event.words);
+            appendPrintable(text, event.words);
         }
         text += '\n';
         _output.lineDone();

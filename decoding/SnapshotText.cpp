@@ -3,6 +3,7 @@
 #include "decoding/DisplayJson.h"
 #include "host/Snapshot.h"
 #include "text/Format.h"
+#include "text/Printable.h"
 
 namespace pallax {
 
@@ -25,11 +26,12 @@ PropertyList sectionsOf(const PropertyList& display) {
 } // namespace
 
 void appendSnapshotText(std::string& out, const std::string& name, const Snapshot& snapshot) {
-    out.append(name).append("\n  format      snapshot\n");
-    out += formatText("  saved       %@\n  description %@\n  displays    %llu\n",
-                      {snapshot.saved, snapshot.description, snapshot.displays.size()});
+    out.append(printable(name)).append("\n  format      snapshot\n");
+    out += formatText(
+        "  saved       %@\n  description %@\n  displays    %llu\n",
+        {printable(snapshot.saved), printable(snapshot.description), snapshot.displays.size()});
     for (const Snapshot::Display& display : snapshot.displays) {
-        out += formatText("              %@\n", {display.description});
+        out += formatText("              %@\n", {printable(display.description)});
     }
     out += formatText("  DLF log     %@\n  sections    %@\n",
                       {sizeText(snapshot.dlf), kSharedSections});

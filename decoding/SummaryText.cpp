@@ -3,6 +3,7 @@
 #include "decoding/DisplayJson.h"
 #include "platform/ZoneText.h"
 #include "text/Format.h"
+#include "text/Printable.h"
 
 #include <algorithm>
 #include <utility>
@@ -221,7 +222,8 @@ void addContent(Dictionary& object, const SummarizedFile& file) {
 } // namespace
 
 void appendSummaryText(std::string& out, const SummarizedFile& file, const Clock& zone) {
-    out.append(file.recording.name()).append("\n");
+    appendPrintable(out, file.recording.name());
+    out += '\n';
     appendRow(out, "format", file.recording.format());
     appendRow(out, "technology", technologyText(file.recording));
     appendRow(out, "packets", packetsText(file.summary));

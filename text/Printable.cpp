@@ -93,6 +93,12 @@ void appendPrintable(std::string& out, std::string_view text) {
     appendCharacters(out, text, commandsTerminal);
 }
 
+std::string printable(std::string_view text) {
+    std::string out;
+    appendPrintable(out, text);
+    return out;
+}
+
 void appendPrintableLines(std::string& out, std::string_view text) {
     appendCharacters(out, text, [](char32_t codePoint) {
         return commandsTerminal(codePoint) && codePoint != '\n' && codePoint != '\t';

@@ -23,6 +23,7 @@ void appendValidUtf8(std::string& out, std::string_view text);
 /// Appends the text in a form safe for terminals, in one line: replaces each invalid byte and
 /// escapes each character that could command a terminal.
 void appendPrintable(std::string& out, std::string_view text);
+std::string printable(std::string_view text);
 
 /// The same for a text of several lines: keeps line ends and tabs.
 void appendPrintableLines(std::string& out, std::string_view text);

@@ -116,6 +116,13 @@ TEST_F(EventsCommandTest, TheSecondPartAloneBeginsWithoutAState) {
     EXPECT_TRUE(reports.empty());
 }
 
+TEST_F(EventsCommandTest, ANameIsPartOfOneLine) {
+    add("a\n\x1B.pcap", {cell(0, 1), cell(9, 2)});
+    add("b", {});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_TRUE(written.starts_with("a\\x0A\\x1B.pcap: 2023")) << written;
+}
+
 TEST_F(EventsCommandTest, AFatalRecordIsTheLastEventOfItsRecording) {
     const std::string unreadable = textOf(Record(0xFF0000).u8(1).bytes());
     add("a.pcap", {cell(0, 1), {seconds(1), unreadable}, cell(2, 2)});

@@ -209,5 +209,11 @@ TEST_F(InfoCommandTest, TheNumberedPartsOfARecordingAreOne) {
                                                 "without the part between them: a-0003.pcap."});
 }
 
+TEST_F(InfoCommandTest, ANameIsOneLine) {
+    add("a\nb.pcap", {});
+    EXPECT_EQ(run(), kExitSuccess);
+    EXPECT_TRUE(written.starts_with("a\\x0Ab.pcap\n  format")) << written;
+}
+
 } // namespace
 } // namespace pallax

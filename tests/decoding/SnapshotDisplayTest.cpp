@@ -76,18 +76,20 @@ TEST_F(SnapshotDisplayTest, OtherMessagesAreIgnored) {
 
 TEST(SnapshotText, TellsDisplaysAndLog) {
     Snapshot snapshot{"then", "here", {{"Snapshot x", Time(), cell("A")}}, nullptr};
+    snapshot.description = "he\nre";
     std::string text;
-    appendSnapshotText(text, "s.pallax", snapshot);
-    EXPECT_EQ(text, "s.pallax\n"
+    appendSnapshotText(text, "s\n.pallax", snapshot);
+    EXPECT_EQ(text, "s\\x0A.pallax\n"
                     "  format      snapshot\n"
                     "  saved       then\n"
-                    "  description here\n"
+                    "  description he\\x0Are\n"
                     "  displays    1\n"
                     "              Snapshot x\n"
                     "  DLF log     none\n"
                     "  sections    Displays that share a section all show it as it was when the "
                     "snapshot was saved.\n");
     snapshot.dlf = PropertyList::data({1, 2}).data();
+    snapshot.description = "here";
     std::string json;
     appendSnapshotJson(json, "s.pallax", snapshot);
     EXPECT_EQ(json, R"({"file":"s.pallax","format":"snapshot","saved":"then","description":"here",)"

@@ -14,12 +14,6 @@ std::string validUtf8(std::string_view text) {
     return out;
 }
 
-std::string printable(std::string_view text) {
-    std::string out;
-    appendPrintable(out, text);
-    return out;
-}
-
 std::string printableLines(std::string_view text) {
     std::string out;
     appendPrintableLines(out, text);
