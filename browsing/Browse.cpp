@@ -12,8 +12,10 @@
 #include "decoding/SnapshotDisplay.h"
 #include "host/Complaint.h"
 #include "host/Interruption.h"
+#include "host/JoinedRecording.h"
 #include "host/LogSinks.h"
 #include "host/RecordingFile.h"
+#include "host/RecordingParts.h"
 #include "host/Snapshot.h"
 #include "link/Settings.h"
 #include "telephony/ChildService.h"
@@ -117,7 +119,7 @@ std::optional<std::string> refusalOf(const Source& source) {
     if (file == nullptr) {
         return std::nullopt;
     }
-    const Recording::OpenResult recording = Recording::open(file->path);
+    const Recording::OpenResult recording = openParts(file->parts(), Recording::open);
     if (!recording) {
         return std::nullopt; // the child service reports it, as for an unknown link type
     }
@@ -159,10 +161,16 @@ ExitStatus browseWithLog(const Request& request) {
         complain("Standard input is a terminal; pipe a recording into it.");
         return kExitWrongUsage;
     }
-    const auto loss = recording ? outputIntoRecording({&*recording, 1}) : std::nullopt;
+    const auto* file = std::get_if<FileRecording>(&source);
+    const auto loss = file != nullptr ? outputIntoRecording(file->parts())
+                      : recording     ? outputIntoRecording({&*recording, 1})
+                                      : std::nullopt;
     if (loss) {
         complain(*loss);
         return kExitFailure;
+    }
+    if (const auto missing = file != nullptr ? missingParts(file->parts()) : std::nullopt) {
+        complain(*missing);
     }
     std::unique_ptr<ChildService> child;
     if (!std::holds_alternative<ServiceModem>(source)) {

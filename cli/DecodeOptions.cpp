@@ -122,6 +122,7 @@ void addContent(CLI::App& app, DecodeOptions& options) {
            "Write only these fields (repeat it for several)")
         ->expected(1)
         ->take_all()
+        ->allow_extra_args(false)
         ->type_name("FIELD");
     app.add_option("--where", options.where, "Write only the displays at which this holds")
         ->type_name("CONDITION");

@@ -4,6 +4,7 @@
 #include "cli/CommandLine.h"
 #include "cli/OptionParts.h"
 #include "cli/SimulateOptions.h"
+#include "text/Format.h"
 
 #include <CLI/CLI.hpp>
 
@@ -29,6 +30,9 @@ constexpr const char* kFooter = R"(Examples:
   pallax info drive.pcap               what a recording holds
   pallax status drive.pcap             the radio at its end, in a few lines
   pallax sql drive.pcap 'select ...'   any question
+
+The numbered parts of a recording (drive-0001.pcapng drive-0002.pcapng) are
+browsed as one, in the order of their times.
 
 Each command has its own help (pallax decode --help). To open a recording with
 the name of a command, add its folder (pallax ./decode).
@@ -155,6 +159,21 @@ void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
     app.add_flag("--loop", play.loop, "Restart at the end of the recording")->needs(recording);
 }
 
+/// One recording or, of several paths, the one whose parts they are.
+Source recordingToBrowse(const std::vector<std::string>& paths) {
+    if (paths.size() == 1) {
+        return recordingAt(paths.front());
+    }
+    const auto parts = recordingInParts(paths);
+    if (!parts) {
+        throw CLI::ValidationError("RECORDING",
+                                   formatText("%@ and %@ are not the numbered parts of "
+                                              "one recording",
+                                              {paths.front(), paths.back()}));
+    }
+    return *parts;
+}
+
 void addLogLevel(CLI::App& app, std::optional<int>& level) {
     constexpr int kHighestLevel = 7;
     app.add_option("--log-level", level,
@@ -183,11 +202,13 @@ void addView(CLI::App& app, BrowseOptions& options) {
 
 void addBrowse(CLI::App& app, BrowseOptions& options) {
     CLI::Option* recording =
-        app.add_option_function<std::string>(
+        app.add_option_function<std::vector<std::string>>(
                "RECORDING",
-               [&options](const std::string& path) { options.source = recordingAt(path); },
+               [&options](const std::vector<std::string>& paths) {
+                   options.source = recordingToBrowse(paths);
+               },
                "The recording or saved snapshot to browse (pcap or pcapng, a file or a named "
-               "pipe; - is standard input; default: the live modem)")
+               "pipe; - is standard input; default: the live modem), or the numbered parts of one")
             ->type_name("");
     addView(app, options);
     addPlay(app, options.play, recording);

@@ -53,11 +53,12 @@ Recording::OpenResult JoinedRecording::open(const std::vector<std::string>& path
     if (!joined->openNext()) {
         return *joined->_failed;
     }
-    joined->_name = joined->_part->name();
-    if (parts.size() > 1) {
-        joined->_name += formatText(" and %d more", {parts.size() - 1});
-    }
+    joined->_name = nameOf(joined->_part->name(), parts.size() - 1);
     return std::unique_ptr<Recording>(std::move(joined));
+}
+
+std::string JoinedRecording::nameOf(const std::string& first, std::size_t further) {
+    return further == 0 ? first : formatText("%@ and %zu more", {first, further});
 }
 
 void JoinedRecording::note(const RecordingError& error) {

@@ -21,6 +21,9 @@ public:
     /// once.
     static OpenResult open(const std::vector<std::string>& paths, Open open);
 
+    /// "drive-0001.pcapng and 1 more".
+    static std::string nameOf(const std::string& first, std::size_t further);
+
     const std::string& name() const override { return _name; }
     std::string format() const override { return _part->format(); }
     int linkType() const override { return _part->linkType(); }

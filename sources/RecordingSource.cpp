@@ -1,9 +1,14 @@
 #include "sources/RecordingSource.h"
 
+#include "host/JoinedRecording.h"
+
 namespace pallax {
 
-Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const Recording::Input& input) {
-    auto recording = Recording::openInput(input);
+namespace {
+
+using Known = Result<std::unique_ptr<Recording>, HostError>;
+
+Known known(Recording::OpenResult recording) {
     if (!recording) {
         return HostError{recording.error().sentence};
     }
@@ -13,13 +18,23 @@ Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const Recording
     return std::move(recording).value();
 }
 
-Result<std::unique_ptr<PacketSource>, HostError> RecordingSource::open(const std::string& path) {
-    auto recording = openKnownRecording({path});
+} // namespace
+
+Known openKnownRecording(const Recording::Input& input) {
+    return known(Recording::openInput(input));
+}
+
+Known openKnownRecording(const FileRecording& file) {
+    return known(openParts(file.parts(), Recording::open));
+}
+
+Result<std::unique_ptr<PacketSource>, HostError> RecordingSource::open(const FileRecording& file) {
+    auto recording = openKnownRecording(file);
     if (!recording) {
         return recording.error();
     }
     return std::unique_ptr<PacketSource>(
-        std::make_unique<RecordingSource>(path, std::move(recording).value()));
+        std::make_unique<RecordingSource>(file, std::move(recording).value()));
 }
 
 std::string RecordingSource::technology() const {
@@ -39,7 +54,7 @@ void RecordingSource::whenReady(std::function<void()> ready) {
 }
 
 bool RecordingSource::restart() {
-    auto again = openKnownRecording({_path});
+    auto again = openKnownRecording(_file);
     if (!again) {
         return false;
     }

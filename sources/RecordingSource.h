@@ -2,6 +2,7 @@
 
 #include "host/Recording.h"
 #include "sources/PacketSource.h"
+#include "sources/Source.h"
 
 namespace pallax {
 
@@ -9,10 +10,13 @@ namespace pallax {
 class RecordingSource final : public PacketSource {
 public:
     /// Fails if the recording cannot be opened or has an unknown link type.
-    static Result<std::unique_ptr<PacketSource>, HostError> open(const std::string& path);
+    static Result<std::unique_ptr<PacketSource>, HostError> open(const std::string& path) {
+        return open(FileRecording{path});
+    }
+    static Result<std::unique_ptr<PacketSource>, HostError> open(const FileRecording& file);
 
-    explicit RecordingSource(std::string path, std::unique_ptr<Recording> recording)
-        : _path(std::move(path)), _recording(std::move(recording)) {}
+    explicit RecordingSource(FileRecording file, std::unique_ptr<Recording> recording)
+        : _file(std::move(file)), _recording(std::move(recording)) {}
 
     std::string technology() const override;
     Next next() override;
@@ -21,11 +25,12 @@ public:
     std::string failure() const override;
 
 private:
-    std::string _path;
+    FileRecording _file;
     std::unique_ptr<Recording> _recording;
 };
 
 /// Opens a recording and checks its technology.
+Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const FileRecording& file);
 Result<std::unique_ptr<Recording>, HostError> openKnownRecording(const Recording::Input& input);
 
 } // namespace pallax

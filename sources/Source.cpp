@@ -1,9 +1,13 @@
 #include "sources/Source.h"
 
+#include "host/JoinedRecording.h"
 #include "host/Recording.h"
 #include "host/RecordingFile.h"
+#include "host/RecordingParts.h"
 
 #include <charconv>
+#include <map>
+#include <set>
 #include <string_view>
 #include <utility>
 
@@ -76,6 +80,33 @@ Source recordingAt(std::string path) {
     return FileRecording{std::move(path)};
 }
 
+std::vector<std::string> FileRecording::parts() const {
+    std::vector<std::string> parts{path};
+    parts.insert(parts.end(), further.begin(), further.end());
+    return parts;
+}
+
+std::optional<Source> recordingInParts(const std::vector<std::string>& paths) {
+    std::map<unsigned, std::string> parts;
+    std::set<std::string> wholes;
+    for (const std::string& path : paths) {
+        const auto part = partNameOf(path);
+        if (!part || RecordingFile::isStream(path)) {
+            return std::nullopt;
+        }
+        wholes.insert(part->whole);
+        parts.emplace(part->number, path);
+    }
+    if (wholes.size() != 1 || parts.size() != paths.size()) {
+        return std::nullopt;
+    }
+    FileRecording recording;
+    for (const auto& [number, path] : parts) {
+        (recording.path.empty() ? recording.path : recording.further.emplace_back()) = path;
+    }
+    return recording;
+}
+
 std::optional<std::string> recordingPath(const Source& source) {
     if (const auto* file = std::get_if<FileRecording>(&source)) {
         return file->path;
@@ -89,7 +120,9 @@ std::optional<std::string> recordingPath(const Source& source) {
 std::string sourceName(const Source& source) {
     return std::visit(
         Visitor{[](const ServiceModem& /*modem*/) { return std::string("live modem"); },
-                [](const FileRecording& file) { return file.path; },
+                [](const FileRecording& file) {
+                    return JoinedRecording::nameOf(file.path, file.further.size());
+                },
                 [](const StreamedRecording& stream) {
                     const std::string path =
                         stream.path == kStandardInput ? "standard input" : stream.path;
@@ -110,7 +143,9 @@ std::vector<std::string> argumentsOf(const Source& source) {
     return std::visit(
         Visitor{[](const ServiceModem& /*modem*/) { return Arguments{std::string(kService)}; },
                 [](const FileRecording& file) {
-                    return Arguments{std::string(kFile), file.path};
+                    Arguments arguments = file.parts();
+                    arguments.insert(arguments.begin(), std::string(kFile));
+                    return arguments;
                 },
                 [](const StreamedRecording& stream) {
                     return Arguments{std::string(kStream), stream.path, stream.name};
@@ -134,8 +169,8 @@ std::optional<Source> sourceOf(std::span<const std::string> arguments) {
     if (kind == kService && count == 1) {
         return ServiceModem();
     }
-    if (kind == kFile && count == 2) {
-        return FileRecording{arguments[1]};
+    if (kind == kFile && count >= 2) {
+        return FileRecording{arguments[1], {arguments.begin() + 2, arguments.end()}};
     }
     if (kind == kStream && count == 3) {
         return StreamedRecording{arguments[1], arguments[2]};

@@ -13,9 +13,12 @@ namespace pallax {
 /// The modem behind this machine's telephony service.
 struct ServiceModem {};
 
-/// A recording in a file, which each reader reads from its start.
+/// A recording in a file, or in numbered parts, which each reader reads from its start.
 struct FileRecording {
     std::string path;
+    std::vector<std::string> further = {}; ///< the other parts
+
+    std::vector<std::string> parts() const;
 };
 
 /// A recording that can be read once, usually while it is written.
@@ -29,8 +32,11 @@ using Source = std::variant<ServiceModem, FileRecording, StreamedRecording, Simu
 
 /// The recording at a path of the command line.
 Source recordingAt(std::string path);
+/// The recording whose numbered parts are at these paths, in any order; nothing if they are
+/// anything else.
+std::optional<Source> recordingInParts(const std::vector<std::string>& paths);
 
-/// The path of a recording; nothing for a modem.
+/// The path of a recording, or of its first part; nothing for a modem.
 std::optional<std::string> recordingPath(const Source& source);
 /// "drive.pcap", "standard input", "live modem", "simulated lte".
 std::string sourceName(const Source& source);

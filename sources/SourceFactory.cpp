@@ -67,7 +67,11 @@ std::string streamName(const StreamedRecording& stream) {
 Result<OpenSource, HostError> openRecording(const Source& source, const std::string& path,
                                             SourceSurroundings surroundings) {
     const auto* stream = std::get_if<StreamedRecording>(&source);
+    const auto* file = std::get_if<FileRecording>(&source);
     const auto open = [&] {
+        if (file != nullptr && !file->further.empty()) {
+            return openKnownRecording(*file);
+        }
         return openKnownRecording(
             {path, stream != nullptr ? stream->name : std::string(),
              [&](std::string_view sentence) { surroundings.report(std::string(sentence)); }});
@@ -80,9 +84,13 @@ Result<OpenSource, HostError> openRecording(const Source& source, const std::str
         const std::string name = stream != nullptr ? streamName(*stream) : path;
         return readersOf(std::move(recording).value(), name, std::move(surroundings));
     }
-    return OpenSource{std::string((*recording)->technology()->identifier),
-                      [path] { return RecordingSource::open(path); }, nullptr,
-                      lockForReading(path)};
+    const FileRecording read = file != nullptr ? *file : FileRecording{path};
+    OpenSource opened{std::string((*recording)->technology()->identifier),
+                      [read] { return RecordingSource::open(read); }};
+    for (const std::string& part : read.parts()) {
+        opened.reading.push_back(lockForReading(part));
+    }
+    return opened;
 }
 
 } // namespace

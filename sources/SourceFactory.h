@@ -11,6 +11,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace pallax {
 
@@ -36,7 +37,7 @@ struct OpenSource {
     std::string technology;
     PacketSourceFactory makeReader;
     std::shared_ptr<Relay> relay = nullptr; ///< null unless the source is relayed
-    Descriptor reading{};                   ///< keeps recorders from replacing the recording
+    std::vector<Descriptor> reading = {};   ///< keep recorders from replacing the recording
 };
 
 /// Opens a source of packets: a recording or a simulated modem. Fails at once if nothing could be

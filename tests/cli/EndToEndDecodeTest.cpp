@@ -161,6 +161,34 @@ TEST_F(EndToEnd, DecodeOfEveryFieldIsTheWholeTable) {
               "pallax: No field is named \"lte.no_such_field\" (see pallax fields).\n");
 }
 
+TEST_F(EndToEnd, DecodeWritesValuesColumnsAndTables) {
+    const std::string path = PALLAX_SOURCE_DIR "/samples/lte-drive.pcap";
+    const std::string rsrp = "lte.serving_cell_measurements.measured_rsrp";
+    const Run file = run({"decode", "--samples", "--select", rsrp, path});
+    EXPECT_TRUE(file.out.starts_with(R"({"time":"2023-11-14T22:13:)")) << file.out;
+    EXPECT_EQ(run({"decode", "--samples", "--select", rsrp, "-"}, path).out, file.out);
+    EXPECT_EQ(run({"decode", "--samples", "--jobs", "2", "--select", rsrp, path, path}).out,
+              file.out + file.out);
+    const Run wide = run({"decode", "--wide", "--select", rsrp, path});
+    EXPECT_TRUE(wide.out.starts_with("time,tick," + rsrp + "\n2023-11-14T22:13:22.036Z,1,"))
+        << wide.out;
+    const Run piped = run({"decode", "--wide", "-"}, path);
+    EXPECT_EQ(piped.status, 1);
+    EXPECT_EQ(piped.err, "pallax: standard input: --wide needs a file, because the columns must be "
+                         "known before the first row.\n");
+    const Run table =
+        run({"decode", "--table", "Serving Cell Measurements", "--select", rsrp, path});
+    EXPECT_TRUE(table.out.starts_with("Name           Value\nMeasured RSRP  -")) << table.out;
+    const Run unknown = run({"decode", "--table", "Serving Cel Info", path});
+    EXPECT_EQ(unknown.status, 2);
+    EXPECT_EQ(unknown.err, "pallax: " + path +
+                               " has no section \"Serving Cel Info\". Did you mean "
+                               "\"serving_cell_info\"?\n");
+    const Run reversed = run({"decode", "--from", "2023-11-15", "--to", "2023-11-14", path});
+    EXPECT_EQ(reversed.status, 2);
+    EXPECT_EQ(reversed.err, "pallax: The time of --from is later than that of --to.\n");
+}
+
 TEST_F(EndToEnd, DecodeOfPartsThatARecorderWroteIsThatOfTheWhole) {
     const std::vector<Packet> packets{{std::chrono::milliseconds(0), registration(0)},
                                       {std::chrono::seconds(5), registration(1)},
@@ -172,6 +200,18 @@ TEST_F(EndToEnd, DecodeOfPartsThatARecorderWroteIsThatOfTheWhole) {
         EXPECT_EQ(run({"decode", "--every", every, "--join", second, first}).out,
                   run({"decode", "--every", every, whole}).out);
     }
+    // Other commands join them by themselves.
+    EXPECT_EQ(run({second, "--print", first, "--speed", "max"}).out,
+              run({whole, "--print", "--speed", "max"}).out);
+    EXPECT_EQ(run({"events", second, first}).out, run({"events", whole}).out);
+    EXPECT_EQ(run({"sql", second, first, "select * from sample"}).out,
+              run({"sql", whole, "select * from sample"}).out);
+    const std::string third = record("part-0004.pcap", {packets[0]});
+    const Run missing = run({second, "--print", first, third, "--speed", "max"});
+    EXPECT_EQ(missing.status, 0);
+    EXPECT_EQ(missing.err, "pallax: " + second + " and " + third +
+                               " are read as one, without the part between them: " +
+                               world.path("part-0003.pcap") + ".\n");
     const Run stream = run({"decode", "--join", first, "-"}, second);
     EXPECT_EQ(stream.status, 1);
     EXPECT_EQ(stream.err, "pallax: - cannot be joined: it can be read only once.\n");

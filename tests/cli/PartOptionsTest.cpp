@@ -12,6 +12,8 @@ TEST(Options, DecodeTakesAPartOfARecording) {
     EXPECT_TRUE(part.window.from && part.window.to);
     EXPECT_EQ(part.select, (std::vector<std::string>{"lte.*", "gsm.?"}));
     EXPECT_EQ(part.recordings, (std::vector<std::string>{"a.pcap", "b.pcap"}));
+    EXPECT_EQ(parsed<DecodeOptions>({"decode", "--select", "a", "b.pcap", "c.pcap"}).recordings,
+              (std::vector<std::string>{"b.pcap", "c.pcap"}));
     EXPECT_TRUE(part.typed);
     EXPECT_TRUE(part.join);
     EXPECT_FALSE(part.recordingColumn);

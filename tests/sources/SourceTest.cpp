@@ -49,9 +49,23 @@ TEST(Source, OnlyAStreamIsReadOnce) {
     EXPECT_FALSE(isReadOnce(drive("lte")));
 }
 
+TEST(Source, NumberedPartsAreOneRecording) {
+    const auto source = recordingInParts({"d-0003.pcap", "d-0001.pcap", "d-0002.pcap.gz"});
+    ASSERT_TRUE(source);
+    EXPECT_EQ(std::get<FileRecording>(*source).parts(),
+              (std::vector<std::string>{"d-0001.pcap", "d-0002.pcap.gz", "d-0003.pcap"}));
+    EXPECT_EQ(sourceName(*source), "d-0001.pcap and 2 more");
+    EXPECT_EQ(recordingPath(*source), "d-0001.pcap");
+    EXPECT_FALSE(recordingInParts({"d-0001.pcap", "e-0002.pcap"}));
+    EXPECT_FALSE(recordingInParts({"d-0001.pcap", "d-0001.pcap"}));
+    EXPECT_FALSE(recordingInParts({"d-0001.pcap", "-"}));
+    EXPECT_FALSE(recordingInParts({"d.pcap", "d-2.pcap"}));
+}
+
 TEST(Source, IsWrittenAsArguments) {
     EXPECT_EQ(argumentsOf(ServiceModem()), (Arguments{"service"}));
     EXPECT_EQ(argumentsOf(FileRecording{"a b"}), (Arguments{"file", "a b"}));
+    EXPECT_EQ(argumentsOf(FileRecording{"a", {"b", "c"}}), (Arguments{"file", "a", "b", "c"}));
     EXPECT_EQ(argumentsOf(StreamedRecording{"-", "pipe"}), (Arguments{"stream", "-", "pipe"}));
     SimulationOptions options = drive("utran");
     EXPECT_EQ(argumentsOf(options), (Arguments{"simulated", "utran", "1", "40"}));
@@ -70,6 +84,9 @@ TEST(Source, IsReadFromItsArguments) {
             break;
         case 1:
             source = FileRecording{doubles::any::text()};
+            for (int further = doubles::any::between(0, 3); further > 0; --further) {
+                std::get<FileRecording>(source).further.push_back(doubles::any::text());
+            }
             break;
         case 2:
             source = StreamedRecording{doubles::any::text(), doubles::any::text()};
@@ -95,10 +112,9 @@ TEST(Source, IsReadFromItsArguments) {
 TEST(Source, OtherArgumentsStandForNone) {
     for (const Arguments& arguments :
          {Arguments{}, Arguments{"modem"}, Arguments{"service", "x"}, Arguments{"file"},
-          Arguments{"file", "a", "b"}, Arguments{"stream", "-"}, Arguments{"simulated"},
-          Arguments{"simulated", "lte", "1"}, Arguments{"simulated", "nr", "1", "40"},
-          Arguments{"simulated", "lte", "-1", "40"}, Arguments{"simulated", "lte", "1", "0"},
-          Arguments{"simulated", "lte", "1", "40", "0"},
+          Arguments{"stream", "-"}, Arguments{"simulated"}, Arguments{"simulated", "lte", "1"},
+          Arguments{"simulated", "nr", "1", "40"}, Arguments{"simulated", "lte", "-1", "40"},
+          Arguments{"simulated", "lte", "1", "0"}, Arguments{"simulated", "lte", "1", "40", "0"},
           Arguments{"simulated", "lte", "1", "40", "6x"},
           Arguments{"simulated", "lte", "1", "40", "60", "1"}}) {
         EXPECT_FALSE(sourceOf(arguments)) << testing::PrintToString(arguments);
