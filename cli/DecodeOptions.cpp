@@ -50,10 +50,10 @@ its unit; what is missing is null. Fields that no display shows are among them.
 
 With --wide a column is called as its field, in a list with what identifies the
 entry, which is the same wherever the entry stands:
-lte.neighbor_cells_list.measured_rsrp[Physical Cell ID 275, E-ARFCN 1850]. There
-is one for each field that the recording has, so choose some with --select. A
-row has the current values at a tick (--every packet: after each packet);
-numbers have no units. The recording is read twice and cannot be a pipe.
+lte.neighbor_cells_list.measured_rsrp[Physical Cell ID 275]. There is one for
+each field that the recording has, so choose some with --select. A row has the
+current values at a tick (--every packet: after each packet); numbers have no
+units. The recording is read twice and cannot be a pipe.
 
 A SECTION of --table is named as on the screen, or as in the names of its fields
 (neighbor_cells_list); a list inside a section, with both names. The table is

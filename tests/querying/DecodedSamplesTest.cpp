@@ -1,7 +1,5 @@
-#include "console/Output.h"
-#include "decoding/DecodeCommand.h"
-#include "decoding/DroppedNotices.h"
 #include "tests/query/QueryFixture.h"
+#include "tests/querying/DecodedJournal.h"
 
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
@@ -11,33 +9,6 @@
 namespace pallax {
 namespace {
 
-/// A journal as a recording.
-class JournalRecording final : public Recording {
-public:
-    JournalRecording(const MemoryJournal& journal, const RecordedTechnology& technology)
-        : _journal(journal), _technology(technology) {}
-
-    const std::string& name() const override { return _name; }
-    int linkType() const override { return _technology.linkType; }
-    const RecordedTechnology* technology() const override { return &_technology; }
-    RecordingError foreignLinkType() const override { return {}; }
-    std::optional<RecordedPacket> next() override {
-        if (_next == _journal.size()) {
-            return std::nullopt;
-        }
-        const JournalPacket packet = _journal.packet(++_next);
-        return RecordedPacket{packet.time, packet.data, false};
-    }
-    const std::optional<RecordingError>& error() const override { return _error; }
-
-private:
-    const MemoryJournal& _journal;
-    const RecordedTechnology& _technology;
-    std::string _name = "drive";
-    std::uint64_t _next = 0;
-    std::optional<RecordingError> _error;
-};
-
 /// Whether its values are parts of property lists, of which the table has no numbers.
 bool isObject(const std::string& field) {
     return field.find(".sim_info.") != std::string::npos || field.ends_with(".pdp_context_info");
@@ -46,18 +17,8 @@ bool isObject(const std::string& field) {
 /// What `decode --samples` writes, as rows of the table `sample`.
 std::vector<std::string> decoded(TimelineFixture& fixture) {
     DecodeOptions options;
-    options.recordings = {"drive"};
     options.view = DecodeView::Samples;
-    DroppedNotices notices;
-    std::string written;
-    Output output([&written](std::string_view block) { written += block; });
-    const auto open = [&fixture](const std::string& /*path*/) -> Recording::OpenResult {
-        return std::unique_ptr<Recording>(
-            std::make_unique<JournalRecording>(fixture.journal, fixture.technology));
-    };
-    DecodeCommand command(options, {fixture.resources, fixture.bundle, notices, technologies()},
-                          open, [](std::string_view sentence) { ADD_FAILURE() << sentence; });
-    EXPECT_EQ(command.run(output), kExitSuccess);
+    const std::string written = decodedText(fixture, options);
     std::vector<std::string> rows;
     const auto text = [](const nlohmann::json& value) {
         return value.is_null()     ? "NULL"
