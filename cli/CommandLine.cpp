@@ -103,6 +103,7 @@ CommandLine::CommandLine()
     addSnapshot(addCommand("snapshot", "Write a part of a saved snapshot"), _snapshot);
     addSql(addCommand("sql", "Ask a recording in SQL"), _sql);
     addStatus(addCommand("status", "Show the radio in a few lines"), _status);
+    addDiff(addCommand("diff", "Compare two recordings, or two moments of one"), _diff);
     addTexts();
 }
 
@@ -225,6 +226,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("sql")) {
         return _sql;
+    }
+    if (_app->got_subcommand("diff")) {
+        return _diff;
     }
     if (_app->got_subcommand("status")) {
         return _status;

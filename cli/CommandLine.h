@@ -42,6 +42,7 @@ private:
     InfoOptions _info;
     SqlOptions _sql;
     StatusOptions _status;
+    DiffOptions _diff;
     SnapshotOptions _snapshot;
     RecordOptions _record;
     ServiceRequest _service;

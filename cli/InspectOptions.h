@@ -6,12 +6,14 @@ class App;
 
 namespace pallax {
 
+struct DiffOptions;
 struct InfoOptions;
 struct SnapshotOptions;
 struct SqlOptions;
 struct StatusOptions;
 
 /// The options of the commands that look into files. They must outlive the app.
+void addDiff(CLI::App& app, DiffOptions& options);
 void addInfo(CLI::App& app, InfoOptions& options);
 void addSnapshot(CLI::App& app, SnapshotOptions& options);
 void addSql(CLI::App& app, SqlOptions& options);

@@ -29,6 +29,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax explain earfcn 1850           what a number, a code or a field means
   pallax info drive.pcap               what a recording holds
   pallax status drive.pcap             the radio at its end, in a few lines
+  pallax diff drive.pcap@14:02 drive.pcap@14:03     what has changed
   pallax sql drive.pcap 'select ...'   any question
 
 The numbered parts of a recording (drive-0001.pcapng drive-0002.pcapng) are

@@ -8,6 +8,7 @@
 #include "decoding/InfoCommand.h"
 #include "decoding/SnapshotCommand.h"
 #include "explaining/ExplainCommand.h"
+#include "inspecting/DiffCommand.h"
 #include "inspecting/StatusCommand.h"
 #include "querying/SqlCommand.h"
 #include "recording/RecordOptions.h"
@@ -36,7 +37,7 @@ struct ServiceStatusOptions {};
 using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions, InfoOptions,
-                 SnapshotOptions, SqlOptions, StatusOptions, ParseEnd>;
+                 SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -1,5 +1,6 @@
 #include "cli/InspectOptions.h"
 #include "cli/OptionParts.h"
+#include "inspecting/DiffCommand.h"
 #include "inspecting/StatusCommand.h"
 
 #include <CLI/CLI.hpp>
@@ -32,6 +33,35 @@ Exit status:
   2   wrong usage
   3   could not tell: the recording cannot be read, or lacks that time)";
 
+constexpr const char* kDiffFooter = R"(Examples:
+  pallax diff drive.pcap@14:02:50 drive.pcap@14:03:10
+  pallax diff --select 'lte.*rsrp' monday.pcap tuesday.pcap
+  pallax diff PallaxSnapshot-1700000000.pallax drive.pcap@end
+  pallax diff --json drive.pcap@start drive.pcap@+90s | jq -r .field
+
+Compares the radio at two moments. BEFORE and AFTER are recordings or saved
+snapshots, FILE or FILE@TIME, with a TIME as in pallax decode --help; without
+one, the end is meant. A file whose name contains "@" is found first. "-" is
+standard input.
+
+Entries of lists are compared by what identifies them, such as the identity of a
+cell, not by their place: one is "gone", "new", or has other values. For values
+with a unit the difference follows; that of two levels in dBm is in dB.
+
+Left out are fields that are not shown, and those that count or follow time,
+which always differ: sub-frame and offset numbers, and the counters of blocks.
+With --all they are compared too, and those that --select names. A FIELD is a
+name that pallax fields lists; * stands for any letters.
+
+JSON has a line for each value, with its field, its entry, and its change:
+changed, gone or new. Where nothing differs, nothing is written.
+
+Exit status:
+  0   nothing differs
+  1   something differs, or the reader of the output has gone
+  2   wrong usage
+  3   could not tell: a file is damaged or lacks that time; or failure)";
+
 } // namespace
 
 void addStatus(CLI::App& app, StatusOptions& options) {
@@ -47,6 +77,27 @@ void addStatus(CLI::App& app, StatusOptions& options) {
         ->required()
         ->type_name("");
     app.footer(kStatusFooter);
+}
+
+void addDiff(CLI::App& app, DiffOptions& options) {
+    addTechnology(app, "--technology", options.technology,
+                  "The technology of the recordings (default: from their link type)");
+    app.add_option_function<std::vector<std::string>>(
+           "--select",
+           [&options](const std::vector<std::string>& names) {
+               options.select.insert(options.select.end(), names.begin(), names.end());
+           },
+           "Compare only these fields (repeat it for several)")
+        ->expected(1)
+        ->take_all()
+        ->type_name("FIELD");
+    app.add_flag("--all", options.all, "Compare hidden fields and counters, too");
+    app.add_flag("--json", options.json, "JSON, one object per line");
+    app.add_option("BEFORE", options.before, "A recording or saved snapshot, or FILE@TIME")
+        ->required()
+        ->type_name("");
+    app.add_option("AFTER", options.after, "What to compare it with")->required()->type_name("");
+    app.footer(kDiffFooter);
 }
 
 } // namespace pallax

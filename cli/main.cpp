@@ -41,6 +41,7 @@ struct Run {
     ExitStatus operator()(const InfoOptions& options) const { return runInfo(options); }
     ExitStatus operator()(const SqlOptions& options) const { return runSql(options); }
     ExitStatus operator()(const StatusOptions& options) const { return runStatus(options); }
+    ExitStatus operator()(const DiffOptions& options) const { return runDiff(options); }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);

@@ -9,13 +9,9 @@
 
 namespace pallax {
 
-namespace {
-
-bool hasName(const std::string& field, const std::string& name) {
+bool isNamed(const std::string& field, const std::string& name) {
     return ::fnmatch(name.c_str(), field.c_str(), 0) == 0;
 }
-
-} // namespace
 
 FieldSelection::FieldSelection(const std::vector<std::string>& names,
                                const RecordedTechnology& technology, const Resources& resources) {
@@ -30,7 +26,7 @@ FieldSelection::FieldSelection(const std::vector<std::string>& names,
 void FieldSelection::add(const std::vector<std::string>& names, const FieldRegistry& registry) {
     for (const FieldInfo& field : registry.fields()) {
         if (std::any_of(names.begin(), names.end(),
-                        [&field](const std::string& name) { return hasName(field.name, name); })) {
+                        [&field](const std::string& name) { return isNamed(field.name, name); })) {
             _paths.insert(field.path);
         }
     }
@@ -44,7 +40,7 @@ std::optional<std::string> FieldSelection::unknownName(const std::vector<std::st
         const auto& fields = registry.fields();
         std::erase_if(unknown, [&fields](const std::string& name) {
             return std::any_of(fields.begin(), fields.end(), [&name](const FieldInfo& field) {
-                return hasName(field.name, name);
+                return isNamed(field.name, name);
             });
         });
     }
@@ -117,10 +113,10 @@ std::optional<PropertyList> FieldSelection::entriesOf(const Dictionary& entries,
     return isEmpty ? std::nullopt : std::optional<PropertyList>(std::move(selected));
 }
 
-bool ChosenFields::isNamed(const std::string& field) const {
+bool ChosenFields::isChosen(const std::string& field) const {
     return _names.empty() ||
            std::any_of(_names.begin(), _names.end(),
-                       [&field](const std::string& name) { return hasName(field, name); });
+                       [&field](const std::string& name) { return isNamed(field, name); });
 }
 
 } // namespace pallax

@@ -13,8 +13,10 @@
 
 namespace pallax {
 
-/// Some of a technology's fields, chosen by name. "*" in a name stands for any letters, "?" for
-/// one.
+/// Whether `field` is the name in which "*" stands for any letters and "?" for one.
+bool isNamed(const std::string& field, const std::string& name);
+
+/// Some of a technology's fields, chosen by name.
 class FieldSelection {
 public:
     FieldSelection(const std::vector<std::string>& names, const FieldRegistry& registry) {
@@ -52,13 +54,13 @@ public:
 
     bool has(FieldIndex field) {
         while (_isChosen.size() <= field) {
-            _isChosen.push_back(isNamed(_fields[static_cast<FieldIndex>(_isChosen.size())].name));
+            _isChosen.push_back(isChosen(_fields[static_cast<FieldIndex>(_isChosen.size())].name));
         }
         return _isChosen[field];
     }
 
 private:
-    bool isNamed(const std::string& field) const;
+    bool isChosen(const std::string& field) const;
 
     std::vector<std::string> _names;
     const FieldTable& _fields;

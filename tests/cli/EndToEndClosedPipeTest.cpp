@@ -68,7 +68,7 @@ TEST_F(EndToEndClosedPipe, EndsHelpAndVersion) {
     endsQuietly({"--help"});
     endsQuietly({"--version"});
     for (const char* command : {"decode", "record", "service", "demo", "simulate", "events",
-                                "fields", "explain", "info", "snapshot", "sql", "status"}) {
+                                "fields", "explain", "info", "snapshot", "sql", "status", "diff"}) {
         endsQuietly({command, "--help"});
     }
 }

@@ -272,6 +272,23 @@ TEST_F(EndToEndStatus, OfStatus) {
     expectEveryDocumentedStatus({"status"});
 }
 
+TEST_F(EndToEndStatus, OfDiff) {
+    ends({{"diff", sample, sample}, 0, ""});
+    ends({{"diff", sample + "@start", sample}, 1, ""});
+    ends({{"diff", sample}, 2, "pallax: AFTER is required (see pallax diff --help)\n"});
+    ends({{"diff", sample + "@noon", sample},
+          2,
+          "pallax: \"noon\" is not a time: expected 14:03, 2023-11-14T14:03, +90s, -5m, start or "
+          "end (character 1) (see pallax diff --help)\n"});
+    ends({{"diff", sample, missing}, 3, isMissing});
+    ends({{"diff", sample + "@start", sample},
+          3,
+          "pallax: Standard output cannot be written: No space left on device.\n",
+          "/dev/null",
+          "/dev/full"});
+    expectEveryDocumentedStatus({"diff"});
+}
+
 TEST_F(EndToEndStatus, OfSql) {
     ends({{"sql", sample, "select count(*) from packet"}, 0, ""});
     ends({{"sql", missing, "select 1"}, 1, isMissing});

@@ -97,6 +97,22 @@ TEST(Options, SnapshotTakesAFile) {
     EXPECT_EQ(parsed<SnapshotOptions>({"snapshot", "--dlf", "a", "-o", "b"}).output, "b");
 }
 
+TEST(Options, ADifferenceIsOfTwoMoments) {
+    const auto plain = parsed<DiffOptions>({"diff", "a@14:03", "b"});
+    EXPECT_EQ(plain.before, "a@14:03");
+    EXPECT_EQ(plain.after, "b");
+    EXPECT_FALSE(plain.all);
+    EXPECT_FALSE(plain.json);
+    EXPECT_TRUE(plain.select.empty());
+    const auto all = parsed<DiffOptions>({"diff", "--all", "--json", "--select", "lte.*",
+                                          "--select", "gsm.*", "--technology", "lte", "a", "b"});
+    EXPECT_TRUE(all.all);
+    EXPECT_TRUE(all.json);
+    EXPECT_EQ(all.select, (std::vector<std::string>{"lte.*", "gsm.*"}));
+    EXPECT_EQ(all.technology->commandName, "lte");
+    EXPECT_EQ(ended({"diff", "a", "b", "c"}).status, kExitWrongUsage);
+}
+
 TEST(Options, AStatusIsOfOneRecordingAtATime) {
     const auto plain = parsed<StatusOptions>({"status", "a"});
     EXPECT_EQ(plain.recording, "a");

@@ -34,7 +34,7 @@ TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
               (std::vector<std::string>{
                   "pallax", "pallax-decode", "pallax-record", "pallax-service", "pallax-demo",
                   "pallax-simulate", "pallax-events", "pallax-fields", "pallax-explain",
-                  "pallax-info", "pallax-snapshot", "pallax-sql", "pallax-status"}));
+                  "pallax-info", "pallax-snapshot", "pallax-sql", "pallax-status", "pallax-diff"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 
