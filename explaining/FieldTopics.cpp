@@ -62,15 +62,23 @@ std::optional<Refusal> addQuality(Answer& answer, const std::string& field, cons
     if (!value) {
         return value.error();
     }
+    answer.heading += " " + numberText(*value);
+    answer.object.set("quality", PropertyList());
     const auto measure = measureOf(field);
     if (!measure) {
-        return unknown(formatText("No profile judges %@.", {field}));
+        answer.rows.push_back({"quality", "No profile judges this field."});
+        return std::nullopt;
     }
-    auto judgement = judge(*measure, *value, library);
+    const auto judged = judge(*measure, *value, library);
+    if (!judged) {
+        return judged.error();
+    }
+    const std::optional<Judgement>& judgement = *judged;
     if (!judgement) {
-        return judgement.error();
+        answer.rows.push_back({"quality", notJudged(*measure, library)});
+        return std::nullopt;
     }
-    answer.heading += formatText(" %@: %@", {numberText(*value), judgement->verdict});
+    answer.heading += ": " + judgement->verdict;
     answer.rows.insert(answer.rows.end(), judgement->rows.begin(), judgement->rows.end());
     answer.object.set("quality", judgement->object);
     return std::nullopt;

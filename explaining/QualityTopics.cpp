@@ -52,9 +52,13 @@ AnswersResult explainMeasure(std::string_view topic, Words operands, const Libra
             formatText("explain %@ takes a number%@%@, not \"%@\"",
                        {topic, info.unit.empty() ? "" : " of ", info.unit, operands[1]}));
     }
-    auto judgement = judge(measure, *value, library);
+    const auto judged = judge(measure, *value, library);
+    if (!judged) {
+        return judged.error();
+    }
+    const std::optional<Judgement>& judgement = *judged;
     if (!judgement) {
-        return judgement.error();
+        return unknown(notJudged(measure, library));
     }
     Answer answer{formatText("%@ %@: %@", {topic, withUnit(*value, measure), judgement->verdict}),
                   {{"meaning", std::string(info.meaning)}},
@@ -94,15 +98,19 @@ AnswersResult explainProfile(std::string_view /*topic*/, Words operands, const L
 
 } // namespace
 
-Result<Judgement, Refusal> judge(Measure measure, double value, const Library& library) {
+std::string notJudged(Measure measure, const Library& library) {
+    return formatText("The profile %@ does not judge %@.", {library.profile, infoOf(measure).name});
+}
+
+Result<std::optional<Judgement>, Refusal> judge(Measure measure, double value,
+                                                const Library& library) {
     const auto profile = profileNamed(library.profile, library);
     if (!profile) {
         return profile.error();
     }
     const auto borders = profile->borders.find(measure);
     if (borders == profile->borders.end()) {
-        return unknown(
-            formatText("The profile %@ does not judge %@.", {profile->name, infoOf(measure).name}));
+        return std::optional<Judgement>();
     }
     const std::string_view grade = nameOf(borders->second.gradeOf(value));
     Judgement judgement{formatText("%@ (profile %@)", {grade, profile->name}),
@@ -115,7 +123,7 @@ Result<Judgement, Refusal> judge(Measure measure, double value, const Library& l
                          {"source", profile->source}}};
     addBorders(judgement.rows, measure, borders->second);
     judgement.rows.push_back({"source", profile->source});
-    return judgement;
+    return std::optional(std::move(judgement));
 }
 
 std::vector<Topic> qualityTopics() {

@@ -42,14 +42,17 @@ std::optional<AnswersResult> explainNetwork(Words words, const Library& library)
 std::optional<AnswersResult> explainField(Words words, const Library& library,
                                           std::vector<std::string>& known);
 
-/// The quality of a value as rows and as entries of an object; a refusal if the profile cannot
-/// judge it.
+/// The quality of a value as rows and as entries of an object.
 struct Judgement {
     std::string verdict; ///< "good (profile android)"
     std::vector<Answer::Row> rows;
     Dictionary object;
 };
-Result<Judgement, Refusal> judge(Measure measure, double value, const Library& library);
+/// Nothing if the profile does not judge the measure; a refusal if it cannot be used.
+Result<std::optional<Judgement>, Refusal> judge(Measure measure, double value,
+                                                const Library& library);
+/// "The profile android does not judge rssi."
+std::string notJudged(Measure measure, const Library& library);
 
 /// A whole number, or the refusal that names the topic and its operands.
 Result<std::uint32_t, Refusal> numberIn(std::string_view topic, const std::string& word);

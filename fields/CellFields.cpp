@@ -62,7 +62,8 @@ constexpr auto kCells = std::to_array<CellFields>({
     {"lte", Role::Candidate, System::Cdma, "lte.reselection_candidates_list.pilot",
      "lte.reselection_candidates_list.channel"},
 
-    {"utran", Role::Serving, System::UtraTdd, serving_cells::kUtran[0], serving_cells::kUtran[1]},
+    {"utran", Role::Serving, System::UtraTdd, "utran.serving_cell_info.cell_scrambling_code",
+     "utran.serving_cell_info.downlink_uarfcn"},
     {"utran", Role::Neighbour, System::UtraTdd, "utran.neighbor_cell_list.cell_id",
      "utran.neighbor_cell_list.uarfcn"},
     {"utran",

@@ -22,7 +22,7 @@ inline constexpr std::array<std::string_view, 2> kLte{"lte.serving_cell_info.phy
                                                       "lte.serving_cell_info.download_frequency"};
 inline constexpr std::array<std::string_view, 2> kLteMeasured{
     "lte.serving_cell_measurements.physical_cell_id", "lte.serving_cell_measurements.e_arfcn"};
-inline constexpr std::array<std::string_view, 2> kUtran{
-    "utran.serving_cell_info.cell_scrambling_code", "utran.serving_cell_info.downlink_uarfcn"};
+/// Not the scrambling code: it can come seconds after the channel of the new cell.
+inline constexpr std::array<std::string_view, 1> kUtran{"utran.serving_cell_info.cell_id"};
 
 } // namespace pallax::serving_cells

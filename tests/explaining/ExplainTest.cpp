@@ -221,10 +221,17 @@ TEST_F(Explain, AValueOfAFieldHasAQuality) {
     EXPECT_EQ(nlohmann::json::parse(json({name, "-109"}))["quality"]["grade"], "fair");
     EXPECT_EQ(told({name, "low"}), "2: explain " + name + " takes a number, not \"low\"");
     EXPECT_EQ(told({name, "1", "2"}), "2: explain " + name + " takes one value");
-    EXPECT_EQ(told({"lte.serving_cell_measurements.srxlev", "20"}),
-              "1: No profile judges lte.serving_cell_measurements.srxlev.");
-    EXPECT_EQ(told({"lte.serving_cell_measurements.measured_rssi", "-70"}),
-              "1: The profile android does not judge rssi.");
+}
+
+TEST_F(Explain, AValueThatTheProfileDoesNotJudgeHasItsField) {
+    const std::string srxlev = "lte.serving_cell_measurements.srxlev";
+    EXPECT_TRUE(told({srxlev, "20"}).starts_with(srxlev + " 20\n  meaning "));
+    EXPECT_TRUE(told({srxlev, "20"}).ends_with("  quality    No profile judges this field.\n"));
+    EXPECT_TRUE(nlohmann::json::parse(json({srxlev, "20"}))["quality"].is_null());
+    const std::string rssi = "lte.serving_cell_measurements.measured_rssi";
+    EXPECT_TRUE(
+        told({rssi, "-70"}).ends_with("  quality    The profile android does not judge rssi.\n"));
+    EXPECT_FALSE(nlohmann::json::parse(json({rssi})).contains("quality"));
 }
 
 TEST_F(Explain, AnUnknownWordHasASuggestion) {

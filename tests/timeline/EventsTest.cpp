@@ -103,6 +103,16 @@ TEST_F(EventsTest, MeasurementsTellTheCellOnlyWhileNothingElseDoes) {
     EXPECT_EQ(events(), (Lines{"10 s cell-change: serving cell 7 → 8 after 10 s"}));
 }
 
+TEST_F(EventsTest, ACellOfUtranHasOneNameWhicheverRecordTellsOfIt) {
+    use("utran");
+    const auto cell = [](std::uint32_t identity, std::uint16_t channel) {
+        return Record(0xD0E2).padTo(19).u16(channel).u32(identity).padTo(26);
+    };
+    add(0, cell(10987549, 10096));
+    add(50, cell(10936855, 10088));
+    EXPECT_EQ(events(), (Lines{"50 s cell-change: serving cell 10987549 → 10936855 after 50 s"}));
+}
+
 TEST_F(EventsTest, StatesOfUtran) {
     use("utran");
     add(0, Record(0xD0E0).u8(1).u8(0));
