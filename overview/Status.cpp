@@ -36,15 +36,14 @@ std::string trimmed(std::string text) {
     return text;
 }
 
-std::optional<std::uint32_t> wholeNumber(const FieldValue& value) {
+std::optional<std::uint32_t> wholeNumber(double number) {
     constexpr double kMost = 4294967295.0;
-    const bool isWhole =
-        value.number >= 0 && value.number <= kMost && value.number == std::trunc(value.number);
-    return isWhole ? std::optional(static_cast<std::uint32_t>(value.number)) : std::nullopt;
+    const bool isWhole = number >= 0 && number <= kMost && number == std::trunc(number);
+    return isWhole ? std::optional(static_cast<std::uint32_t>(number)) : std::nullopt;
 }
 
 std::string siteOf(RadioSystem system, const FieldValue& identity) {
-    const auto number = wholeNumber(identity);
+    const auto number = wholeNumber(identity.number);
     const bool isUmts = system == RadioSystem::UmtsFdd || system == RadioSystem::UtraTdd;
     if (const auto cell = number && system == RadioSystem::Lte ? lteCell(*number) : std::nullopt) {
         return formatText("eNodeB %u sector %u", {cell->eNodeB, cell->sector});
@@ -187,10 +186,7 @@ void Gathering::addLevel(StatusCell& cell, StatusValue level) {
 
 void Gathering::addChannel(StatusCell& cell, const StatusCellFields& rule,
                            const FieldValue* band) const {
-    const auto number =
-        cell.channel && std::isfinite(cell.channel->number) && cell.channel->number >= 0
-            ? std::optional(static_cast<std::uint32_t>(cell.channel->number))
-            : std::nullopt;
+    const auto number = cell.channel ? wholeNumber(cell.channel->number) : std::nullopt;
     if (!number) {
         return;
     }

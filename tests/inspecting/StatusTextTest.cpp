@@ -1,6 +1,8 @@
 #include "inspecting/StatusText.h"
 
-#include <gtest/gtest.h>
+#include "knowledge/Networks.h"
+#include "tests/doubles/Property.h"
+#include "tests/timeline/TimelineFixture.h"
 
 #include <algorithm>
 #include <sstream>
@@ -18,6 +20,12 @@ std::string textOf(const Status& status) {
     std::string text;
     appendStatusText(text, {"a.pcap", "lte", "LTE"}, status);
     return text;
+}
+
+std::ptrdiff_t columnsIn(const std::string& line) {
+    return std::count_if(line.begin(), line.end(), [](char byte) {
+        return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U;
+    });
 }
 
 Status emptyStatus() {
@@ -60,14 +68,32 @@ TEST(StatusText, FitsTenLinesOfEightyColumnsAndKeepsTheProfile) {
     EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 10) << text;
     std::istringstream lines(text);
     for (std::string line; std::getline(lines, line);) {
-        const auto columns = std::count_if(line.begin(), line.end(), [](char byte) {
-            return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U;
-        });
-        EXPECT_LE(columns, 80) << line;
-        EXPECT_GT(columns, 12) << line;
+        EXPECT_LE(columnsIn(line), 80) << line;
+        EXPECT_GT(columnsIn(line), 12) << line;
     }
     EXPECT_NE(text.find("levels      profile field · GSM RSRP"), std::string::npos) << text;
     EXPECT_NE(text.find("…\n"), std::string::npos) << text;
+}
+
+TEST(StatusText, OfAnyPacketsFits) {
+    const NetworkNames names;
+    const QualityProfile profile = *builtInProfile(kDefaultProfile);
+    EXPECT_TRUE(doubles::holds([&] {
+        TimelineFixture fixture(doubles::any::elementOf(technologyNames()));
+        fixture.anyPackets(30);
+        const auto timeline = fixture.indexed();
+        const Status status =
+            statusOf(timeline->valuesAt(timeline->packets()), kNow, names, profile);
+        const std::string text = textOf(status);
+        RC_ASSERT(std::count(text.begin(), text.end(), '\n') <= 10);
+        std::istringstream lines(text);
+        for (std::string line; std::getline(lines, line);) {
+            RC_ASSERT(columnsIn(line) <= 80);
+        }
+        std::string json;
+        appendStatusJson(json, {"a.pcap", "lte", "LTE"}, status);
+        RC_ASSERT(std::count(json.begin(), json.end(), '\n') == 1);
+    }));
 }
 
 TEST(StatusText, TextsOfAModemStayInTheirLine) {

@@ -86,6 +86,15 @@ TEST(Status, OfUmtsACellIsThatOfAController) {
     EXPECT_EQ(status.cells[1].channel, std::nullopt);
 }
 
+TEST(Status, AChannelThatIsNoneHasNoBand) {
+    ValuesFixture lte("lte");
+    lte.read(0, {{"Serving Cell Info", Dictionary{{"Download Frequency", "99999999999"}}}});
+    const StatusCell cell = statusAt(0, lte).cells.front();
+    EXPECT_EQ(cell.channel->text, "99999999999");
+    EXPECT_EQ(cell.band, "");
+    EXPECT_EQ(cell.megahertz, std::nullopt);
+}
+
 TEST(Status, OfLevelsWithOneNameTheLatestCounts) {
     const Dictionary idle{
         {"Serving Cell Measurements",
