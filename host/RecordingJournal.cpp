@@ -51,7 +51,6 @@ private:
             return;
         }
         _recording = std::move(opened).value();
-        _journal._error.reset();
         _next = 1;
         _expected.reset();
         const auto& places = _journal._places;
@@ -123,9 +122,8 @@ private:
     }
 
     void stop() {
-        if (const auto& error = _recording->error()) {
-            _journal._error = error->sentence;
-        }
+        const auto& error = _recording->error();
+        _journal._error = error ? std::optional(error->sentence) : std::nullopt;
         _continueAt = _next;
         _sizeAtEnd = sizeOfFile(_journal._path);
         _recording.reset();

@@ -106,6 +106,15 @@ TEST_F(RecordingJournalTest, ReadsOnWhenTheFileHasGrown) {
     expectAnyStart(*journal);
 }
 
+TEST_F(RecordingJournalTest, HowTheFileEndsIsNotForgottenByAReaderThatStopsEarlier) {
+    writePcap();
+    std::filesystem::resize_file(path, std::filesystem::file_size(path) - 100);
+    const auto journal = opened();
+    (void)readAll(*journal->reader(1), 1);
+    EXPECT_TRUE(journal->reader(1)->next());
+    EXPECT_EQ(journal->trouble(), path + " ends in the middle of a packet.");
+}
+
 TEST_F(RecordingJournalTest, AFileThatWasReplacedIsToldAndNotRead) {
     writePcap();
     const auto journal = opened();
