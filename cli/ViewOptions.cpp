@@ -42,7 +42,7 @@ constexpr const char* kDiffFooter = R"(Examples:
 Compares the radio at two moments. BEFORE and AFTER are recordings or saved
 snapshots, FILE or FILE@TIME, with a TIME as in pallax decode --help; without
 one, the end is meant. A file whose name contains "@" is found first. "-" is
-standard input.
+standard input; with times, write "pallax diff -- -@14:02 -@14:03".
 
 Entries of lists are compared by what identifies them, such as the identity of a
 cell, not by their place: one is "gone", "new", or has other values. For values

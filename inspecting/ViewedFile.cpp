@@ -47,7 +47,6 @@ ViewedFile::open(const std::string& path, const RecordedTechnology* technology,
     file->_name = path == "-" ? "standard input" : path;
     file->_recorded = std::move(recorded).value();
     file->_technology = technologyOfCommandName(file->_recorded->timeline().fields().technology());
-    file->_notes = file->_recorded->notes(); // later readers may not come to the end again
     return file;
 }
 
@@ -122,15 +121,7 @@ Result<Moment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text, cons
 }
 
 std::vector<std::string> ViewedFile::notes() const {
-    std::vector<std::string> notes = _notes;
-    if (_recorded) {
-        for (std::string& note : _recorded->notes()) {
-            if (std::find(notes.begin(), notes.end(), note) == notes.end()) {
-                notes.push_back(std::move(note));
-            }
-        }
-    }
-    return notes;
+    return _recorded ? _recorded->notes() : std::vector<std::string>();
 }
 
 } // namespace pallax

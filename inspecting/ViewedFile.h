@@ -54,7 +54,6 @@ private:
 
     std::string _name;
     const RecordedTechnology* _technology = nullptr;
-    std::vector<std::string> _notes;
     std::unique_ptr<RecordedTimeline> _recorded; ///< null: it is a snapshot
     std::unique_ptr<FieldTable> _fields;         ///< of a snapshot
     EntryTable _entries;
