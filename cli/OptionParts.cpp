@@ -1,6 +1,5 @@
 #include "cli/OptionParts.h"
 
-#include "cli/Amounts.h"
 #include "telephony/Service.h"
 #include "text/Suggestion.h"
 
@@ -44,17 +43,7 @@ CLI::Option* addTime(CLI::App& app, const std::string& name, std::optional<TimeT
 
 CLI::Option* addLive(CLI::App& app, bool& live, std::optional<std::chrono::nanoseconds>& duration) {
     CLI::Option* option = app.add_flag("--live", live, "The live modem instead of recordings");
-    const auto takeSeconds = [&duration](const std::string& text) {
-        const auto seconds = parseSeconds(text);
-        if (!seconds) {
-            throw CLI::ValidationError("--for", seconds.error());
-        }
-        duration = *seconds;
-    };
-    app.add_option_function<std::string>("--for", takeSeconds,
-                                         "With --live: end after this many seconds")
-        ->type_name("SECONDS")
-        ->needs(option);
+    addDuration(app, duration, "With --live: end after this many seconds")->needs(option);
     return option;
 }
 

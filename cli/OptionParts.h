@@ -1,5 +1,6 @@
 #pragma once
 
+#include "cli/Amounts.h"
 #include "host/Recording.h"
 #include "telephony/PacketPlayer.h"
 #include "text/TimeText.h"
@@ -63,6 +64,19 @@ void addTechnology(CLI::App& app, const std::string& name, const RecordedTechnol
 /// An option that takes a time of a recording.
 CLI::Option* addTime(CLI::App& app, const std::string& name, std::optional<TimeText>& time,
                      const std::string& description);
+
+/// --for SECONDS.
+template <class Duration>
+CLI::Option* addDuration(CLI::App& app, Duration& duration, const std::string& description) {
+    const auto take = [&duration](const std::string& text) {
+        const auto seconds = parseSeconds(text);
+        if (!seconds) {
+            throw CLI::ValidationError("--for", seconds.error());
+        }
+        duration = *seconds;
+    };
+    return app.add_option_function<std::string>("--for", take, description)->type_name("SECONDS");
+}
 
 /// --live, and --for SECONDS with it.
 CLI::Option* addLive(CLI::App& app, bool& live, std::optional<std::chrono::nanoseconds>& duration);

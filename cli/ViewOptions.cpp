@@ -10,6 +10,7 @@ namespace pallax {
 namespace {
 
 constexpr const char* kStatusFooter = R"(Examples:
+  pallax status
   pallax status drive.pcap
   pallax status --at 14:03:20 drive.pcap
   pallax status --json drive.pcap | jq -r '.cells[].levels[] | .name, .text'
@@ -19,6 +20,9 @@ the operator with the source of its name, the serving cell of each system, its
 channel, band and frequency, the levels, the states of the protocols, the three
 strongest neighbours, and the packet data contexts. What the recording does not
 tell has no line. A line with a value that was read more than 10 s ago says so.
+
+Without a recording, it first receives the live modem for five seconds (--for),
+or until Ctrl-C or the end of its source.
 
 A level is called excellent, good, fair, poor or none by a profile (see pallax
 explain --help), because no standard does; the line names the profile.
@@ -31,7 +35,7 @@ Exit status:
   0   success, or the reader of the output has gone
   1   the recording tells nothing about the radio; or failure, as one sentence
   2   wrong usage
-  3   could not tell: the recording cannot be read, or lacks that time)";
+  3   could not tell: recording or modem cannot be read, or lacks that time)";
 
 constexpr const char* kDiffFooter = R"(Examples:
   pallax diff drive.pcap@14:02:50 drive.pcap@14:03:10
@@ -67,15 +71,20 @@ Exit status:
 void addStatus(CLI::App& app, StatusOptions& options) {
     addTechnology(app, "--technology", options.technology,
                   "The technology of the recording (default: from its link type)");
-    addTime(app, "--at", options.at, "Show the radio at this time (default: at the end)");
+    CLI::Option* at =
+        addTime(app, "--at", options.at, "Show the radio at this time (default: at the end)");
     app.add_option("--profile", options.profile,
                    "The profile that judges levels (default: android)")
         ->type_name("android|field|operator|NAME");
     app.add_flag("--json", options.json, "JSON, one object");
-    app.add_option("RECORDING", options.recording,
-                   "The recording (pcap or pcapng; - is standard input) or saved snapshot")
-        ->required()
-        ->type_name("");
+    CLI::Option* recording =
+        app.add_option("RECORDING", options.recording,
+                       "The recording (pcap or pcapng; - is standard input) or saved snapshot "
+                       "(default: the live modem)")
+            ->type_name("");
+    at->needs(recording);
+    addDuration(app, options.duration, "Receive the live modem for so long (default: 5)")
+        ->excludes(recording);
     app.footer(kStatusFooter);
 }
 

@@ -7,11 +7,14 @@
 #include "fields/Reference.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
+#include "host/Interruption.h"
 #include "host/KnowledgeFiles.h"
 #include "host/UserFolders.h"
 #include "host/WallClock.h"
 #include "inspecting/StatusText.h"
 #include "inspecting/ViewedFile.h"
+#include "link/Settings.h"
+#include "live/LiveSession.h"
 #include "overview/Status.h"
 #include "text/Format.h"
 
@@ -20,12 +23,21 @@
 namespace pallax {
 
 ExitStatus StatusCommand::run(Output& output) {
+    return show(ViewedFile::open(_options.recording, _options.technology, _environment.decoder,
+                                 _environment.journal),
+                output);
+}
+
+ExitStatus StatusCommand::runOn(LiveSession& session, Output& output) {
+    return show(ViewedFile::of(session), output);
+}
+
+ExitStatus StatusCommand::show(const Result<std::unique_ptr<ViewedFile>, NotSeen>& file,
+                               Output& output) {
     const auto refuse = [this](const NotSeen& reason) {
         _environment.report(reason.sentence);
         return reason.isEmpty ? kExitFailure : kExitCouldNotTell;
     };
-    const auto file =
-        ViewedFile::open(_options.recording, _options.technology, _environment.decoder);
     if (!file) {
         return refuse(file.error());
     }
@@ -55,7 +67,32 @@ ExitStatus StatusCommand::run(Output& output) {
     return notes.empty() ? kExitSuccess : kExitCouldNotTell;
 }
 
+namespace {
+
+/// Receives the live modem and shows it. Ctrl-C ends the reception early.
+ExitStatus showLive(const StatusOptions& options, const Settings& settings, StatusCommand& command,
+                    Output& output) {
+    LiveSession session({settings, options.technology, options.duration});
+    std::optional<std::string> failure;
+    {
+        const Interruption interruption;
+        failure = session.run();
+    }
+    if (failure) {
+        complain(*failure);
+        return kExitCouldNotTell;
+    }
+    return command.runOn(session, output);
+}
+
+} // namespace
+
 ExitStatus runStatus(const StatusOptions& options) {
+    const SettingsResult settings = loadSettings(settingsFiles());
+    if (!settings) {
+        complain(settings.error().sentence);
+        return kExitFailure;
+    }
     const auto profile = loadProfile(options.profile, profileFolder());
     if (!profile) {
         complain(profile.error().sentence +
@@ -72,10 +109,16 @@ ExitStatus runStatus(const StatusOptions& options) {
     const WallClock zone;
     const DecoderEnvironment decoder{resources, bundle, notices, technologies()};
     const StatusCommand::Environment environment{
-        decoder, installed.names, *profile, zone,
-        [](const std::string& sentence) { complain(sentence); }};
+        decoder,
+        installed.names,
+        *profile,
+        zone,
+        [](const std::string& sentence) { complain(sentence); },
+        settings->journal};
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
-    return StatusCommand(options, environment).run(output);
+    StatusCommand command(options, environment);
+    return options.recording.empty() ? showLive(options, *settings, command, output)
+                                     : command.run(output);
 }
 
 } // namespace pallax

@@ -2,6 +2,7 @@
 
 #include "host/RecordingFile.h"
 #include "host/Snapshot.h"
+#include "live/LiveSession.h"
 #include "overview/DisplayValues.h"
 #include "plist/PropertyListCodec.h"
 #include "text/Format.h"
@@ -27,7 +28,7 @@ PropertyList displayIn(Bytes message) {
 
 Result<std::unique_ptr<ViewedFile>, NotSeen>
 ViewedFile::open(const std::string& path, const RecordedTechnology* technology,
-                 const DecoderEnvironment& environment) {
+                 const DecoderEnvironment& environment, const BoundedJournal::Limits& journal) {
     if (!RecordingFile::isStream(path)) { // a stream can be opened only once
         const auto recording = Recording::open(path);
         if (!recording) {
@@ -38,7 +39,7 @@ ViewedFile::open(const std::string& path, const RecordedTechnology* technology,
             return openSnapshot(**recording, environment);
         }
     }
-    auto recorded = RecordedTimeline::open({{path}, technology, {}}, environment);
+    auto recorded = RecordedTimeline::open({{path}, technology, journal}, environment);
     if (!recorded) {
         const RecordingError& error = recorded.error();
         return NotSeen{error.sentence, error.kind == RecordingError::Kind::Empty};
@@ -46,7 +47,20 @@ ViewedFile::open(const std::string& path, const RecordedTechnology* technology,
     std::unique_ptr<ViewedFile> file(new ViewedFile);
     file->_name = path == "-" ? "standard input" : path;
     file->_recorded = std::move(recorded).value();
-    file->_technology = technologyOfCommandName(file->_recorded->timeline().fields().technology());
+    file->_timeline = &file->_recorded->timeline();
+    file->_technology = technologyOfCommandName(file->_timeline->fields().technology());
+    return file;
+}
+
+Result<std::unique_ptr<ViewedFile>, NotSeen> ViewedFile::of(LiveSession& session) {
+    if (session.timeline() == nullptr) {
+        return NotSeen{std::string(LiveSession::kNoPacket)};
+    }
+    std::unique_ptr<ViewedFile> file(new ViewedFile);
+    file->_name = "live modem";
+    file->_timeline = session.timeline();
+    file->_technology = technologyOfCommandName(file->_timeline->fields().technology());
+    file->_notes = session.notes();
     return file;
 }
 
@@ -74,10 +88,10 @@ ViewedFile::openSnapshot(Recording& recording, const DecoderEnvironment& environ
 }
 
 TimeSpan ViewedFile::span() const {
-    if (!_recorded) {
+    if (_timeline == nullptr) {
         return {_displays.front().time, _displays.back().time};
     }
-    const auto& stretches = _recorded->timeline().stretches();
+    const auto& stretches = _timeline->stretches();
     TimeSpan span{stretches.front().first, stretches.front().latest};
     for (const Stretch& stretch : stretches) {
         span.end = std::max(*span.end, stretch.latest);
@@ -86,7 +100,7 @@ TimeSpan ViewedFile::span() const {
 }
 
 Result<Moment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text, const ZoneRule& zone) {
-    if (_recorded && _recorded->timeline().packets() == 0) {
+    if (_timeline != nullptr && _timeline->packets() == 0) {
         return NotSeen{formatText("%@ holds no packets.", {_name}), true};
     }
     std::optional<Time> time;
@@ -97,7 +111,7 @@ Result<Moment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text, cons
         }
         time = *found;
     }
-    if (!_recorded) {
+    if (_timeline == nullptr) {
         const Display* latest = nullptr;
         for (const Display& display : _displays) {
             latest = !time || display.time <= *time ? &display : latest;
@@ -107,7 +121,7 @@ Result<Moment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text, cons
                    : NotSeen{formatText(
                          "%@: every display is later than the time that is asked for.", {_name})};
     }
-    Timeline& timeline = _recorded->timeline();
+    Timeline& timeline = *_timeline;
     if (!time) {
         return Moment{timeline.valuesAt(timeline.packets()), timeline.stretches().back().latest,
                       timeline.packets()};
@@ -121,7 +135,7 @@ Result<Moment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text, cons
 }
 
 std::vector<std::string> ViewedFile::notes() const {
-    return _recorded ? _recorded->notes() : std::vector<std::string>();
+    return _recorded ? _recorded->notes() : _notes;
 }
 
 } // namespace pallax

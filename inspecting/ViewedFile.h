@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/BoundedJournal.h"
 #include "querying/RecordedTimeline.h"
 #include "text/TimeText.h"
 #include "timeline/CurrentValues.h"
@@ -11,6 +12,8 @@
 #include <vector>
 
 namespace pallax {
+
+class LiveSession;
 
 /// Why a file does not show what was asked for.
 struct NotSeen {
@@ -28,10 +31,13 @@ struct Moment {
 /// A recording or a saved snapshot whose values can be seen at any of its times.
 class ViewedFile {
 public:
-    /// `technology` overrides that of a recording; null: its own.
-    static Result<std::unique_ptr<ViewedFile>, NotSeen> open(const std::string& path,
-                                                             const RecordedTechnology* technology,
-                                                             const DecoderEnvironment& environment);
+    /// `technology` overrides that of a recording; null: its own. `journal` limits what is kept of
+    /// one that cannot be read again.
+    static Result<std::unique_ptr<ViewedFile>, NotSeen>
+    open(const std::string& path, const RecordedTechnology* technology,
+         const DecoderEnvironment& environment, const BoundedJournal::Limits& journal = {});
+    /// The packets that a live session, which must outlive the file, has received.
+    static Result<std::unique_ptr<ViewedFile>, NotSeen> of(LiveSession& session);
 
     /// At that time, or at the end. In a snapshot: the latest display that is not later.
     Result<Moment, NotSeen> at(const std::optional<TimeText>& time, const ZoneRule& zone);
@@ -54,7 +60,9 @@ private:
 
     std::string _name;
     const RecordedTechnology* _technology = nullptr;
-    std::unique_ptr<RecordedTimeline> _recorded; ///< null: it is a snapshot
+    std::vector<std::string> _notes;             ///< of a live session
+    std::unique_ptr<RecordedTimeline> _recorded; ///< null: it is a snapshot or a live session
+    Timeline* _timeline = nullptr;               ///< null: it is a snapshot
     std::unique_ptr<FieldTable> _fields;         ///< of a snapshot
     EntryTable _entries;
     std::vector<Display> _displays; ///< oldest first

@@ -1,5 +1,6 @@
 #include "live/LiveRecording.h"
 
+#include "live/LiveSession.h"
 #include "platform/RecordedTechnology.h"
 #include "text/Format.h"
 
@@ -19,7 +20,7 @@ Recording::OpenResult LiveRecording::open(const Setup& setup) {
         return *made->_error;
     }
     if (!made->_stamp) {
-        return RecordingError{Kind::Empty, "No packet has come from the live modem."};
+        return RecordingError{Kind::Empty, std::string(LiveSession::kNoPacket)};
     }
     return std::unique_ptr<Recording>(std::move(made));
 }

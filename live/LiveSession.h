@@ -11,6 +11,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace pallax {
@@ -18,6 +19,8 @@ namespace pallax {
 /// The live channel of this machine as a timeline.
 class LiveSession {
 public:
+    static constexpr std::string_view kNoPacket = "No packet has come from the live modem.";
+
     struct Setup {
         const Settings& settings;
         const RecordedTechnology* wanted = nullptr; ///< as for PacketReceiver

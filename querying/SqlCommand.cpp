@@ -11,6 +11,7 @@
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
 #include "host/Files.h"
+#include "host/Interruption.h"
 #include "host/MonotonicClock.h"
 #include "host/WallClock.h"
 #include "link/Settings.h"
@@ -191,11 +192,15 @@ ExitStatus askLive(const SqlOptions& options, const Settings& settings, const Qu
     Waiting waiting;
     LiveSession session({settings, options.technology, options.duration,
                          [&waiting](Timeline& timeline) { waiting.reading(timeline.packets()); }});
-    auto failure = session.run();
+    std::optional<std::string> failure;
+    {
+        const Interruption interruption;
+        failure = session.run();
+    }
     waiting.end();
     Timeline* timeline = session.timeline();
     if (!failure && timeline == nullptr) {
-        failure = "No packet has come from the live modem.";
+        failure = LiveSession::kNoPacket;
     }
     if (failure) {
         complain(*failure);

@@ -1,7 +1,9 @@
 #include "tests/cli/EndToEnd.h"
+#include "tests/doubles/Pattern.h"
 
 #include <nlohmann/json.hpp>
 
+#include <algorithm>
 #include <csignal>
 #include <filesystem>
 #include <fstream>
@@ -56,6 +58,10 @@ TEST_F(EndToEndLive, AnswersAndEventsAreThoseOfTheRecordingThatIsPlayed) {
         EXPECT_EQ(events.status, 0);
         EXPECT_EQ(events.err, "") << technology;
         EXPECT_EQ(events.out, run({"events", path}).out) << technology;
+        const Run status = run({"status", "--for", "1000"});
+        EXPECT_EQ(status.status, 0);
+        EXPECT_EQ(status.err, "") << technology;
+        EXPECT_EQ(doubles::replaced(status.out, "live modem", path), run({"status", path}).out);
         end(service);
     }
 }
@@ -107,12 +113,22 @@ TEST_F(EndToEndLive, ASignalEndsTheReceptionAndTheQueryIsAnswered) {
     end(service);
 }
 
+TEST_F(EndToEndLive, AStatusTakesFiveSecondsOfTheSource) {
+    PallaxProcess service(world, {"service", "--play", drive("lte"), "--speed", "max"});
+    ASSERT_TRUE(serviceIsThere());
+    const auto status = nlohmann::json::parse(run({"status", "--json"}).out);
+    EXPECT_EQ(status["time"].get<std::string>().substr(0, 19), "2023-11-14T22:13:24");
+    EXPECT_EQ(status["recording"], "live modem");
+    end(service);
+}
+
 TEST_F(EndToEndLive, WithoutAModemIsAFailureThatSaysWhy) {
-    for (const auto& command :
-         {std::vector<std::string>{"sql", "--live", "--for", "1.5", "select 1"},
-          {"events", "--live", "--for", "1.5"}}) {
+    for (const auto& [command, status] :
+         {std::pair(std::vector<std::string>{"sql", "--live", "--for", "1.5", "select 1"}, 1),
+          {{"events", "--live", "--for", "1.5"}, 1},
+          {{"status", "--for", "1.5"}, 3}}) {
         const Run run = this->run(command);
-        EXPECT_EQ(run.status, 1);
+        EXPECT_EQ(run.status, status);
         EXPECT_EQ(run.out, "");
         EXPECT_EQ(run.err, "pallax: No telephony service is running; waiting.\n"
                            "pallax: No packet has come from the live modem.\n");
@@ -122,11 +138,13 @@ TEST_F(EndToEndLive, WithoutAModemIsAFailureThatSaysWhy) {
 TEST_F(EndToEndLive, AnotherTechnologyThanTheWantedOneIsRefused) {
     PallaxProcess service(world, {"service", "--play", registrations("a.pcap")});
     ASSERT_TRUE(serviceIsThere());
-    for (const auto& command :
-         {std::vector<std::string>{"sql", "--live", "--technology", "lte", "select 1"},
-          {"events", "--live", "--technology", "lte"}}) {
+    for (const auto& [command, status] :
+         {std::pair(std::vector<std::string>{"sql", "--live", "--technology", "lte", "select 1"},
+                    1),
+          {{"events", "--live", "--technology", "lte"}, 1},
+          {{"status", "--technology", "lte"}, 3}}) {
         const Run run = this->run(command);
-        EXPECT_EQ(run.status, 1);
+        EXPECT_EQ(run.status, status);
         EXPECT_EQ(run.err, "pallax: The modem's technology is Zorell_GSM (gsm), not lte.\n");
     }
     end(service);
@@ -173,6 +191,10 @@ TEST_F(EndToEndLive, WrongUsageIsOneSentence) {
     EXPECT_EQ(refused({"events"}), "pallax: RECORDING is required (see pallax events --help)\n");
     EXPECT_EQ(refused({"events", "--live", "a.pcap"}),
               "pallax: --live excludes RECORDING (see pallax events --help)\n");
+    EXPECT_EQ(refused({"status", "--at", "22:13"}),
+              "pallax: --at requires RECORDING (see pallax status --help)\n");
+    EXPECT_EQ(refused({"status", "--for", "3", "a.pcap"}),
+              "pallax: RECORDING excludes --for (see pallax status --help)\n");
     EXPECT_EQ(refused({"events", "--for", "3", "a.pcap"}),
               "pallax: --for requires --live (see pallax events --help)\n");
     EXPECT_EQ(refused({"sql", "--live", "--for", "0", "select 1"}),
@@ -183,9 +205,11 @@ TEST_F(EndToEndLive, WrongUsageIsOneSentence) {
 TEST_F(EndToEndLive, WrongSettingsAreOneSentence) {
     std::filesystem::create_directories(world.path("config/pallax"));
     std::ofstream(world.path("config/pallax/pallax.conf")) << "journal-hours = 0\n";
-    const Run run = this->run({"events", "--live"});
-    EXPECT_EQ(run.status, 1);
-    EXPECT_NE(run.err.find("journal-hours is a number from 1 to 8760"), std::string::npos);
+    for (const auto& command : {std::vector<std::string>{"events", "--live"}, {"status"}}) {
+        const Run run = this->run(command);
+        EXPECT_EQ(run.status, 1);
+        EXPECT_NE(run.err.find("journal-hours is a number from 1 to 8760"), std::string::npos);
+    }
 }
 
 } // namespace

@@ -262,7 +262,9 @@ TEST_F(EndToEndStatus, OfStatus) {
           "pallax: Standard output cannot be written: No space left on device.\n",
           "/dev/null",
           "/dev/full"});
-    ends({{"status"}, 2, "pallax: RECORDING is required (see pallax status --help)\n"});
+    ends({{"status", "--at", "22:13"},
+          2,
+          "pallax: --at requires RECORDING (see pallax status --help)\n"});
     ends(
         {{"status", "--profile", "fields", sample},
          2,

@@ -113,6 +113,26 @@ TEST(Options, ADifferenceIsOfTwoMoments) {
     EXPECT_EQ(ended({"diff", "a", "b", "c"}).status, kExitWrongUsage);
 }
 
+TEST(Options, TheLiveModemStandsForRecordings) {
+    using namespace std::chrono_literals;
+    EXPECT_FALSE(parsed<EventsOptions>({"events", "a"}).live);
+    const auto events = parsed<EventsOptions>({"events", "--live"});
+    EXPECT_TRUE(events.live);
+    EXPECT_EQ(events.duration, std::nullopt);
+    EXPECT_EQ(parsed<EventsOptions>({"events", "--live", "--for", "0.5"}).duration, 500ms);
+    const auto sql = parsed<SqlOptions>({"sql", "--live", "--for", "60", "select 1"});
+    EXPECT_TRUE(sql.live);
+    EXPECT_EQ(sql.duration, 60s);
+    EXPECT_EQ(sql.words, std::vector<std::string>{"select 1"});
+    EXPECT_EQ(parsed<StatusOptions>({"status"}).recording, "");
+    EXPECT_EQ(parsed<StatusOptions>({"status"}).duration, 5s);
+    EXPECT_EQ(parsed<StatusOptions>({"status", "--for", "2"}).duration, 2s);
+    for (const char* command : {"events", "sql"}) {
+        EXPECT_EQ(ended({command, "--for", "2", "a"}).status, kExitWrongUsage);
+        EXPECT_EQ(ended({command, "--live", "--for", "x"}).status, kExitWrongUsage);
+    }
+}
+
 TEST(Options, AStatusIsOfOneRecordingAtATime) {
     const auto plain = parsed<StatusOptions>({"status", "a"});
     EXPECT_EQ(plain.recording, "a");
