@@ -40,6 +40,8 @@ void SampleReader::valueRead(FieldIndex field, EntryId entry, const FieldValue& 
     const std::uint32_t place = _place++;
     if (!_field || *_field == field) {
         _items.push_back({_packet.number, _packet.time, field, entry, value, place});
+    } else if (place == 0) {
+        _gone.push_back({_items.size(), _packet.number, _packet.time, std::nullopt, 0});
     }
 }
 

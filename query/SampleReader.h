@@ -29,13 +29,14 @@ public:
         constexpr unsigned kPlaceBits = 24;
         return static_cast<std::int64_t>(packet << kPlaceBits | place);
     }
-    /// A list that begins anew, or a field that is gone, before the item with that index.
+    /// A list that begins anew, or a field that is gone, before the item with that index; or that a
+    /// packet has samples of other fields than that of the reader.
     struct Gone {
         std::size_t before;
         std::uint64_t packet;
         Time time;
         std::optional<FieldIndex> field; ///< nothing: a list
-        ListId list = 0;
+        ListId list = 0;                 ///< 0: samples of other fields
     };
 
     /// Only the samples of `field`, if there is one. The timeline must outlive the reader.

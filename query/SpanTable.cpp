@@ -112,8 +112,10 @@ private:
     void take(const SampleReader::Gone& gone) {
         goTo(gone.packet, gone.time);
         if (!gone.field) {
-            _list = gone.list;
-            _replaced.push_back(gone.list);
+            if (gone.list != 0) {
+                _list = gone.list;
+                _replaced.push_back(gone.list);
+            }
             return;
         }
         end(_open.find(keyOf(*gone.field, kNoEntry)), _time);
