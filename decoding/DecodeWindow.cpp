@@ -43,15 +43,17 @@ std::optional<std::string> DecodeWindow::open(const TimeSpan& span, const ZoneRu
     if (_texts.from && _texts.to && _from > _to) {
         return "the time of --from is later than that of --to.";
     }
-    if (_texts.to && _texts.to->isEnd()) {
-        _to = Time::max(); // the last packet need not have the latest stamp
-    } else if (_texts.to) {
+    if (_texts.to && !_texts.to->isEnd()) {
         _lastStretch = stretchOf(_to, span.stretches);
     }
     return std::nullopt;
 }
 
 bool DecodeWindow::isOverBefore(Time packet) {
+    if (_texts.to && _texts.to->isEnd()) {
+        _hasBegun = true; // all packets; the last need not have the latest stamp
+        return false;
+    }
     if (_lastStretch) {
         return isOverInStretch(packet);
     }

@@ -63,6 +63,10 @@ TEST_F(DecodeOptionsTest, DisplaysOfAWindowAreWritten) {
     EXPECT_EQ(between(time("23:13:22"), std::nullopt), "345");
     EXPECT_EQ(between(std::nullopt, time("2023-11-14T22:13:21.5Z")), "12");
     EXPECT_EQ(between(time("start"), time("end")), "12345");
+    options.every = Every::Tick;
+    EXPECT_EQ(between(time("start"), time("end")), "24") << "the last tick is after the end";
+    EXPECT_EQ(between(time("start"), std::nullopt), "245");
+    options.every = Every::Packet;
     EXPECT_EQ(between(time("+10s"), std::nullopt), "");
     EXPECT_EQ(between(std::nullopt, time("2023-11-14T22:13:19Z")), "");
     options.every = Every::Tick;
