@@ -89,6 +89,15 @@ TEST(Options, DecodeWritesATable) {
     }
 }
 
+TEST(Options, TheNumberedPartsOfARecordingAreBrowsed) {
+    const auto options = parsed<BrowseOptions>({"d-0002.pcap", "--print", "d-0001.pcap"});
+    EXPECT_EQ(sourceName(options.source), "d-0001.pcap and 1 more");
+    EXPECT_TRUE(options.print);
+    EXPECT_EQ(ended({"a.pcap", "b.pcap"}).text,
+              "pallax: RECORDING: a.pcap and b.pcap are not the numbered parts of one recording "
+              "(see pallax --help)\n");
+}
+
 TEST(Options, SnapshotTakesAFile) {
     const auto log = parsed<SnapshotOptions>({"snapshot", "--dlf", "a.pallax"});
     EXPECT_EQ(log.file, "a.pallax");
