@@ -152,6 +152,41 @@ TEST(Condition, ComparesTheTruthOfItsValue) {
     EXPECT_FALSE(holds("0 --) or (1"));
 }
 
+/// What compiles is one expression: in parentheses it means the same.
+TEST(Condition, NoTextGetsOutOfItsParentheses) {
+    namespace any = doubles::any;
+    static const std::vector<std::string> kPieces = {
+        "(",  ")",  "'", "\"",     "[",    "]",  "`",       "--",     "/*",   "*/", ";", "\n",
+        " ",  ",",  "1", "packet", "tick", "or", "and",     "not",    "null", "as", "?", "integer",
+        "in", "is", "<", "select", "from", "x",  "is null", "packet", "1",    " ",  ".", "end"};
+    TimelineFixture fixture("lte");
+    Reading reading(fixture);
+    std::size_t compiled = 0;
+    EXPECT_TRUE(doubles::holds([&] {
+        for (int repeated = 0; repeated < 20; ++repeated) {
+            std::string text;
+            for (int count = any::between(1, 6); count > 0; --count) {
+                text += any::elementOf(kPieces) + (any::boolean() ? " " : "");
+            }
+            const auto truth = [&](const std::string& whole) -> std::optional<bool> {
+                const auto condition =
+                    QueryCondition::compile(whole, reading.fields, About::State, noKnowledge());
+                return condition ? std::optional(*(*condition)->holds({{{}, 3}}, reading.values))
+                                 : std::nullopt;
+            };
+            if (const auto alone = truth(text)) {
+                ++compiled;
+                const std::string inside = "(" + text + "\n)";
+                RC_ASSERT(truth(inside) == alone);
+                RC_ASSERT(truth("case when " + inside + " then 1 else 0 end") == alone);
+                RC_ASSERT(truth("0 and " + inside) == false);
+                RC_ASSERT(truth("1 or " + inside) == true);
+            }
+        }
+    }));
+    EXPECT_GT(compiled, 20U);
+}
+
 TEST(Condition, OnAnEventHasItsKindAndWords) {
     TimelineFixture fixture("lte");
     Reading reading(fixture);
