@@ -6,10 +6,10 @@
 namespace pallax {
 
 LineReader::Outcome PlainLines::read(const std::string& before, std::string& line) {
+    const Interrupt interrupt(_hasPrompt ? Interrupt::Watched::Yes : Interrupt::Watched::No);
     if (_hasPrompt) {
         (void)std::fputs(before.empty() ? kPrompt : kPromptOfMore, stderr);
     }
-    const Interrupt interrupt(_hasPrompt ? Interrupt::Watched::Yes : Interrupt::Watched::No);
     line.clear();
     while (line.size() <= kLongestStatement) {
         const int character = std::getc(&_file);

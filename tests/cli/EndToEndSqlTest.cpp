@@ -30,7 +30,7 @@ protected:
     std::string history = world.path("state/pallax/sql-history");
 };
 
-TEST_F(EndToEndSql, AnswersAUserUntilCtrlD) {
+TEST_F(EndToEndSql, AnswersAUser) {
     PallaxTerminal terminal(world, {"sql", drive}, {});
     ASSERT_TRUE(terminal.shows("pallax>"));
     terminal.type("select count(*) as packets\r");
@@ -39,11 +39,20 @@ TEST_F(EndToEndSql, AnswersAUserUntilCtrlD) {
     ASSERT_TRUE(terminal.shows("packets\n   1200\n"));
     terminal.type(".mode csv\r.schema event\r");
     ASSERT_TRUE(terminal.shows("words TEXT"));
-    terminal.type(kEndOfFile);
+    terminal.type(".quit\r");
     EXPECT_EQ(terminal.wait(), 0);
     EXPECT_TRUE(terminal.isRestored());
     EXPECT_EQ(contentOf(history), "select count(*) as packets from packet;\n.mode csv\n"
-                                  ".schema event\n");
+                                  ".schema event\n.quit\n");
+}
+
+TEST_F(EndToEndSql, CtrlDEndsIt) {
+    PallaxTerminal terminal(world, {"sql", drive}, {});
+    ASSERT_TRUE(terminal.shows("pallax>"));
+    (void)terminal.settled();
+    terminal.type(kEndOfFile);
+    EXPECT_EQ(terminal.wait(), 0);
+    EXPECT_TRUE(terminal.isRestored());
 }
 
 TEST_F(EndToEndSql, CompletesNamesAndRemembersStatements) {
@@ -64,7 +73,7 @@ TEST_F(EndToEndSql, CompletesNamesAndRemembersStatements) {
     ASSERT_TRUE(again.shows("pallax>"));
     again.type("\x10\x10\r");
     EXPECT_TRUE(again.shows("    42\n"));
-    again.type(kEndOfFile);
+    again.type(".quit\r");
     EXPECT_EQ(again.wait(), 0);
 }
 
@@ -80,7 +89,7 @@ TEST_F(EndToEndSql, CtrlCStopsAQueryOrClearsTheLine) {
     ASSERT_TRUE(terminal.shows("pallax: The query was stopped.\n"));
     terminal.type("select 6 * 7 as answer;\r");
     EXPECT_TRUE(terminal.shows("    42\n"));
-    terminal.type(kEndOfFile);
+    terminal.type(".quit\r");
     EXPECT_EQ(terminal.wait(), 0);
     EXPECT_TRUE(terminal.isRestored());
 }
@@ -90,6 +99,17 @@ TEST_F(EndToEndSql, CtrlCEndsASingleQueryAtOnce) {
     ASSERT_TRUE(terminal.shows("querying"));
     terminal.type(kInterrupt);
     EXPECT_EQ(terminal.wait(), -SIGINT);
+}
+
+TEST_F(EndToEndSql, TellsThatTheHistoryCannotBeKept) {
+    world.environment = {"XDG_STATE_HOME=/proc/none"};
+    PallaxTerminal terminal(world, {"sql", drive}, {});
+    ASSERT_TRUE(terminal.shows("pallax>"));
+    terminal.type("select 1 as a;\r");
+    EXPECT_TRUE(
+        terminal.shows("pallax: The history cannot be kept in /proc/none/pallax/sql-history.\n"));
+    terminal.type(".quit\r");
+    EXPECT_EQ(terminal.wait(), 0);
 }
 
 TEST_F(EndToEndSql, ReadsQueriesFromStandardInput) {

@@ -247,7 +247,7 @@ TEST_F(EndToEndStatus, OfConditions) {
         "quality('lte.serving_cell_measurements.measured_rsrp', packet, 'unknown') is null";
     const std::string failure = "pallax: --where: there is no profile \"unknown\"\n";
     ends({{"decode", "--where", profile, sample}, 1, failure});
-    ends({{"decode", "--where", "quality('gsm.serving_cell_info.rssi', 1, 'android') is null or 1",
+    ends({{"decode", "--where", "quality('gsm.gsm_serving_cell.rssi', 1, 'android') is null or 1",
            sample},
           0,
           ""});

@@ -88,7 +88,7 @@ const std::vector<Layer>& layers() {
           "timeline", "query", "console", "decoding", "link", "live"}},
         {"inspecting",
          {"text", "plist", "platform", "packets", "LogGenerator/Technologies", "knowledge", "host",
-          "fields", "timeline", "overview", "console", "decoding", "querying"}},
+          "fields", "timeline", "overview", "console", "decoding", "link", "live", "querying"}},
         {"browsing",
          {"text", "platform", "LogGenerator/Technologies", "app/tree", "monitor", "app", "host",
           "ui/terminal", "sources", "telephony", "console", "decoding", "link"}},
