@@ -243,12 +243,10 @@ TEST_F(EndToEndStatus, OfConditions) {
     ends({{"decode", "--where", "tme > 1", sample, sample}, 2, sentence});
     ends({{"decode", "--jobs", "1", "--where", "tme > 1", sample, sample}, 2, sentence});
     ends({{"events", "--where", "tme > 1", sample, sample}, 2, sentence});
-    const std::string profile =
-        "quality('lte.serving_cell_measurements.measured_rsrp', packet, 'unknown') is null";
+    const std::string profile = "quality('gsm.gsm_set.rssi', packet, 'unknown') is null";
     const std::string failure = "pallax: --where: there is no profile \"unknown\"\n";
     ends({{"decode", "--where", profile, sample}, 1, failure});
-    ends({{"decode", "--where", "quality('gsm.gsm_serving_cell.rssi', 1, 'android') is null or 1",
-           sample},
+    ends({{"decode", "--where", "quality('gsm.gsm_set.rssi', 1, 'android') is null or 1", sample},
           0,
           ""});
 }
