@@ -98,14 +98,14 @@ void SeriesStore::add(FieldIndex field, EntryId entry, const FieldValue& value) 
 
 const SeriesStore::Series* SeriesStore::find(FieldIndex field, EntryId entry) const {
     if (entry == kNoEntry) {
-        return field < _plain.size() ? _plain[field] : nullptr;
+        return field < _plain.size() && !_plain[field].runs.empty() ? &_plain[field] : nullptr;
     }
     if (entry >= _ofEntries.size()) {
         return nullptr;
     }
-    for (const OfEntry& each : _ofEntries[entry]) { // there are only a few
+    for (const Series& each : _ofEntries[entry]) { // there are only a few
         if (each.field == field) {
-            return each.series;
+            return &each;
         }
     }
     return nullptr;
@@ -115,23 +115,25 @@ SeriesStore::Series* SeriesStore::seriesOf(FieldIndex field, EntryId entry) {
     if (const Series* found = find(field, entry)) {
         return const_cast<Series*>(found); // NOLINT(cppcoreguidelines-pro-type-const-cast): ours
     }
-    if (_isFull || _series.size() >= _limits.series || entry == EntryTable::kOthers) {
+    if (_isFull || _count >= _limits.series || entry == EntryTable::kOthers) {
         _isFull = true;
         return nullptr;
     }
-    Series& series = _series.emplace_back();
+    ++_count;
     if (entry != kNoEntry) {
         _ofEntries.resize(std::max(_ofEntries.size(), entry + std::size_t{1}));
-        _ofEntries[entry].push_back({field, &series});
-    } else {
-        _plain.resize(std::max(_plain.size(), field + std::size_t{1}));
-        _plain[field] = &series;
+        return &_ofEntries[entry].emplace_back(Series{field, {}});
     }
-    return &series;
+    _plain.resize(std::max(_plain.size(), field + std::size_t{1}));
+    _plain[field].field = field;
+    return &_plain[field];
 }
 
 void SeriesStore::add(Series& series, const SeriesValue& value) {
     std::vector<Run>& runs = series.runs;
+    if (!runs.empty() && runs.back().to == _cell && runs.back().last == value) {
+        return; // it is in the run already
+    }
     const SeriesValue number = numberOnly(value);
     const Run alone{_cell, _cell, value, number, number, value};
     if (runs.empty() || runs.back().to < _cell) {
@@ -145,9 +147,6 @@ void SeriesStore::add(Series& series, const SeriesValue& value) {
         return;
     }
     if (runs.back().from < runs.back().to) {
-        if (runs.back().last == value) {
-            return; // a constant, so nothing changes
-        }
         Run own = runs.back();
         --runs.back().to;
         own.from = _cell;
@@ -191,20 +190,29 @@ void SeriesStore::halveCells() {
     ++_shift;
     _runCount = 0;
     std::vector<Run> merged;
-    for (Series& series : _series) {
-        merged.clear();
-        for (Run run : series.runs) {
-            run.from /= 2;
-            run.to /= 2;
-            appendMerged(merged, run);
+    for (Series& series : _plain) {
+        halveCells(series, merged);
+    }
+    for (std::vector<Series>& ofEntry : _ofEntries) {
+        for (Series& series : ofEntry) {
+            halveCells(series, merged);
         }
-        series.runs.assign(merged.begin(), merged.end());
-        _runCount += merged.size();
     }
     for (std::size_t cell = 0; cell < _times.size(); cell += 2) {
         _times[cell / 2] = _times[cell];
     }
     _times.resize((_times.size() + 1) / 2);
+}
+
+void SeriesStore::halveCells(Series& series, std::vector<Run>& merged) {
+    merged.clear();
+    for (Run run : series.runs) {
+        run.from /= 2;
+        run.to /= 2;
+        appendMerged(merged, run);
+    }
+    series.runs.assign(merged.begin(), merged.end());
+    _runCount += merged.size();
 }
 
 Time SeriesStore::cellTime(std::uint64_t packet) const {

@@ -136,28 +136,27 @@ private:
         }
     };
     struct Series {
-        std::vector<Run> runs;
+        FieldIndex field = 0;
+        std::vector<Run> runs; ///< empty in `_plain`: there is none
     };
 
-    struct OfEntry {
-        FieldIndex field;
-        Series* series;
-    };
-
+    /// Null if there is no room for another series.
     Series* seriesOf(FieldIndex field, EntryId entry);
     const Series* find(FieldIndex field, EntryId entry) const;
     void add(Series& series, const SeriesValue& value);
     static void appendMerged(std::vector<Run>& runs, Run run);
     void halveCells();
+    void halveCells(Series& series, std::vector<Run>& merged);
 
     Limits _limits;
     SeriesTexts _texts;
     unsigned _shift = 0;
     std::uint32_t _cell = 0;
     std::vector<Time> _times; ///< of the cells' first packets
-    std::deque<Series> _series;
-    std::vector<Series*> _plain;                  ///< by field: outside lists
-    std::vector<std::vector<OfEntry>> _ofEntries; ///< by entry
+    // The series stand where they are found: every step on the way to the latest run counts.
+    std::vector<Series> _plain;                  ///< by field: outside lists
+    std::vector<std::vector<Series>> _ofEntries; ///< by entry
+    std::size_t _count = 0;
     std::size_t _runCount = 0;
     bool _isFull = false;
 };
