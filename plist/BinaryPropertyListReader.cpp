@@ -9,6 +9,7 @@
 #include <cmath>
 #include <limits>
 #include <unordered_map>
+#include <vector>
 
 namespace pallax {
 
@@ -29,7 +30,8 @@ public:
     explicit BinaryReader(Bytes bytes)
         : _layout(readLayout(bytes)), _objects(bytes.first(_layout.table)),
           _table(bytes.subspan(_layout.table)), _open(_layout.table),
-          _budget(bytes.size() + kMostExpandedValues), _payloadBudget(_budget) {}
+          _budget(bytes.size() + kMostExpandedValues), _payloadBudget(_budget),
+          _textAt(_layout.table) {}
 
     PropertyList read() { return value(offsetOf(_layout.root, _layout.table), 1); }
 
@@ -53,6 +55,7 @@ private:
     double real(std::uint64_t offset, const Marker& marker) const;
     PropertyList date(std::uint64_t offset, const Marker& marker) const;
     PropertyList data(std::uint64_t offset, const Marker& marker);
+    /// Valid until the next text.
     const Text& text(std::uint64_t offset, const Marker& marker);
     static std::string fromAscii(std::uint64_t offset, Bytes letters);
     static std::string fromUtf8(std::uint64_t offset, Bytes letters);
@@ -66,9 +69,10 @@ private:
     /// keeps the result in proportion to the size of the file.
     std::uint64_t _budget;
     std::uint64_t _payloadBudget;
-    /// Texts and data with several references are built once, by offset.
-    std::unordered_map<std::uint64_t, Text> _texts;
-    std::unordered_map<std::uint64_t, SharedBytes> _data;
+    // Texts and data with several references are built once.
+    std::vector<Text> _texts;
+    std::vector<std::uint32_t> _textAt; ///< by offset: a place in `_texts`, from 1
+    std::unordered_map<std::uint64_t, SharedBytes> _data; ///< by offset
 };
 
 /// The offset of a reference's object; `referrer` is the position of the reference.
@@ -306,16 +310,18 @@ PropertyList BinaryReader::data(std::uint64_t offset, const Marker& marker) {
 }
 
 const Text& BinaryReader::text(std::uint64_t offset, const Marker& marker) {
-    const auto found = _texts.find(offset);
-    if (found != _texts.end()) {
-        return found->second;
+    std::uint32_t& known = _textAt[static_cast<std::size_t>(offset)];
+    if (known != 0) {
+        return _texts[known - 1];
     }
     const Bytes bytes = content(offset, marker, marker.kind == kUtf16 ? 2 : 1);
     spendPayload(offset, bytes.size());
     std::string letters = marker.kind == kUtf16   ? fromUtf16(offset, bytes)
                           : marker.kind == kAscii ? fromAscii(offset, bytes)
                                                   : fromUtf8(offset, bytes);
-    return _texts.emplace(offset, std::move(letters)).first->second;
+    _texts.emplace_back(std::move(letters));
+    known = static_cast<std::uint32_t>(_texts.size());
+    return _texts.back();
 }
 
 std::string BinaryReader::fromAscii(std::uint64_t offset, Bytes letters) {
