@@ -38,7 +38,7 @@ std::optional<std::string> LiveSession::receive(SocketDirectory directory) {
     _timeline = std::make_unique<LiveTimeline>(
         LiveTimeline::Setup{receiver.queue(), _resources, _bundle, technologies(),
                             _setup.settings.journal, complain, indexed});
-    const auto failure = receiver.run();
+    auto failure = receiver.run();
     _timeline->finish();
     return failure;
 }

@@ -29,6 +29,7 @@ std::string textOf(const CurrentValues& values, FieldIndex field) {
 std::vector<std::string> textsOf(const CurrentValues& values,
                                  const std::vector<FieldIndex>& fields) {
     std::vector<std::string> texts;
+    texts.reserve(fields.size());
     for (const FieldIndex field : fields) {
         texts.push_back(textOf(values, field));
     }

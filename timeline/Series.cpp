@@ -157,6 +157,7 @@ std::vector<EntryBuckets> decodedBuckets(Timeline& timeline, FieldIndex field,
                        });
     (void)timeline.read(from, to, reader);
     std::vector<EntryBuckets> all;
+    all.reserve(ofEntries.size());
     for (auto& [entry, buckets] : ofEntries) {
         all.push_back({entry, std::move(buckets)});
     }

@@ -58,7 +58,7 @@ TEST(Snapshot, IsRecognisedByItsShape) {
     EXPECT_FALSE(snapshotOf(Dictionary{{"Timestamp", Dictionary{}}, {"Data", Array{}}}));
     EXPECT_TRUE(snapshotOf(Dictionary{{"Timestamp", "now"}, {"Data", Array{}}}));
     EXPECT_FALSE(snapshotOf("text"));
-    EXPECT_FALSE(snapshotOf({}));
+    EXPECT_FALSE(snapshotOf(PropertyList()));
 }
 
 TEST(Snapshot, ADateThatIsNoneLeavesTheTimeOpen) {
