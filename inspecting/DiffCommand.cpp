@@ -11,6 +11,7 @@
 #include "host/WallClock.h"
 #include "inspecting/DiffText.h"
 #include "text/Format.h"
+#include "text/Printable.h"
 
 #include <algorithm>
 #include <exception>
@@ -107,8 +108,8 @@ ExitStatus DiffCommand::compare(ViewedFile& before, const std::optional<TimeText
         appendDifferencesJson(output.text(), differences);
     } else if (!differences.empty()) {
         const auto momentOf = [&](const ViewedFile& file, const Moment& moment) {
-            return formatText("%@, %@",
-                              {file.name(), localDateText(moment.time, ahead(moment.time))});
+            return formatText(
+                "%@, %@", {printable(file.name()), localDateText(moment.time, ahead(moment.time))});
         };
         output.text() += "before  " + momentOf(before, *one) + "\n";
         output.text() += "after   " + momentOf(after, *other) + "\n";

@@ -20,12 +20,15 @@ constexpr std::size_t kLines = 10; // more than there are kinds of rows
 constexpr std::size_t kNeighbours = 3;
 
 std::string ageText(std::chrono::nanoseconds age) {
-    using std::chrono::minutes;
-    using std::chrono::seconds;
+    using namespace std::chrono;
     if (age < minutes(2)) {
-        return formatText("%lld s ago", {std::chrono::round<seconds>(age).count()});
+        return formatText("%lld s ago", {round<seconds>(age).count()});
     }
-    return formatText("%lld min ago", {std::chrono::floor<minutes>(age).count()});
+    if (age < hours(2)) {
+        return formatText("%lld min ago", {floor<minutes>(age).count()});
+    }
+    return age < days(2) ? formatText("%lld h ago", {floor<hours>(age).count()})
+                         : formatText("%lld days ago", {floor<days>(age).count()});
 }
 
 std::size_t widthOf(const std::string& text) {

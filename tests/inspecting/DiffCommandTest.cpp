@@ -62,6 +62,19 @@ TEST_F(DiffCommandTest, TwoMomentsOfARecordingAreComparedByIdentity) {
     EXPECT_EQ(reports, Sentences());
 }
 
+TEST_F(DiffCommandTest, TheNameOfAFileCannotCommandATerminal) {
+    options.select = {"lte.serving_cell_measurements.measured_rsrp"};
+    const std::string hostile = copy("lte-drive.pcap", "a\n\x1B[2Jb.pcap");
+    EXPECT_EQ(run(hostile + "@+40s", hostile + "@+80s"), kExitFailure);
+    EXPECT_EQ(written, "before  " + folder.file("a\\x0A\\x1B[2Jb.pcap") +
+                           ", 2023-11-14 22:14:00\n" + "after   " +
+                           folder.file("a\\x0A\\x1B[2Jb.pcap") +
+                           ", 2023-11-14 22:14:40\n"
+                           "\n"
+                           "Serving Cell Measurements\n"
+                           "  Measured RSRP  -77.50 dBm → -94.50 dBm (-17.00 dB)\n");
+}
+
 TEST_F(DiffCommandTest, NothingIsWrittenWhereNothingDiffers) {
     EXPECT_EQ(run(lte, lte), kExitSuccess);
     EXPECT_EQ(run(lte + "@end", copy("lte-drive.pcap", "again.pcap")), kExitSuccess);

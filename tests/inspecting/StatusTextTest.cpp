@@ -45,6 +45,13 @@ TEST(StatusText, AValueThatIsOldSaysSo) {
     EXPECT_NE(textOf(status).find("119 s ago\n"), std::string::npos);
     status.cells.front().channel->read = kNow - std::chrono::seconds(179);
     EXPECT_NE(textOf(status).find("2 min ago\n"), std::string::npos);
+    using std::chrono::hours;
+    status.cells.front().channel->read = kNow - hours(2) + std::chrono::seconds(1);
+    EXPECT_NE(textOf(status).find("119 min ago\n"), std::string::npos);
+    status.cells.front().channel->read = kNow - hours(47);
+    EXPECT_NE(textOf(status).find("47 h ago\n"), std::string::npos);
+    status.cells.front().channel->read = kNow - hours(49);
+    EXPECT_NE(textOf(status).find("2 days ago\n"), std::string::npos);
 }
 
 TEST(StatusText, FitsTenLinesOfEightyColumnsAndKeepsTheProfile) {
