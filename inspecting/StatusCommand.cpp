@@ -54,7 +54,8 @@ ExitStatus StatusCommand::show(const Result<std::unique_ptr<ViewedFile>, NotSeen
     const Status status =
         statusOf(moment->values, moment->time, _environment.names, _environment.profile);
     if (status.isEmpty()) {
-        return refuse({formatText("%@ tells nothing about the radio by then.", {(*file)->name()}),
+        return refuse({formatText("%@ tells nothing about the radio%@.",
+                                  {(*file)->name(), _options.at ? " by then" : ""}),
                        notes.empty()});
     }
     const TechnologyReference technology =

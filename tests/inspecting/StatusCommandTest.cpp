@@ -129,6 +129,12 @@ TEST_F(StatusCommandTest, OfNothingIsASentence) {
     std::filesystem::resize_file(header, kFileHeader);
     EXPECT_EQ(run(header), kExitFailure);
     EXPECT_EQ(reports, std::vector<std::string>{header + " holds no packets."});
+    const std::string zeros = folder.file("zeros.pcap");
+    std::filesystem::copy_file(header, zeros);
+    constexpr std::size_t kPacketHeader = 16;
+    std::filesystem::resize_file(zeros, kFileHeader + 3 * kPacketHeader);
+    EXPECT_EQ(run(zeros), kExitFailure);
+    EXPECT_EQ(reports, std::vector<std::string>{zeros + " tells nothing about the radio."});
     options.at = time("start");
     EXPECT_EQ(run(sample("gsm-attach.pcap")), kExitFailure);
     EXPECT_EQ(reports, std::vector<std::string>{sample("gsm-attach.pcap") +
