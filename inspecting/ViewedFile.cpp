@@ -14,8 +14,6 @@ namespace pallax {
 
 namespace {
 
-constexpr const char* kTooEarly = "%@: every packet is later than the time that is asked for.";
-
 /// The display in a message of a snapshot; null if there is none.
 PropertyList displayIn(Bytes message) {
     const auto object = parsePropertyList(message);
@@ -74,8 +72,13 @@ ViewedFile::openSnapshot(Recording& recording, const DecoderEnvironment& environ
             file->_technology = &technologyOfDisplay(display, environment.resources);
             file->_fields = std::make_unique<FieldTable>(*file->_technology, environment.resources);
         }
-        Display& shown = file->_displays.emplace_back(
-            Display{message->time, CurrentValues(*file->_fields, file->_entries)});
+        auto& stretches = file->_stretches;
+        if (stretches.empty() || message->time < stretches.back().end) {
+            stretches.push_back({message->time, message->time});
+        }
+        stretches.back().end = message->time;
+        Display& shown = file->_displays.emplace_back(Display{
+            message->time, stretches.size() - 1, CurrentValues(*file->_fields, file->_entries)});
         giveDisplay(display, message->time, *file->_fields, shown.values);
     }
     if (recording.error()) {
@@ -88,50 +91,87 @@ ViewedFile::openSnapshot(Recording& recording, const DecoderEnvironment& environ
 }
 
 TimeSpan ViewedFile::span() const {
-    if (_timeline == nullptr) {
-        return {_displays.front().time, _displays.back().time};
+    TimeSpan span;
+    span.stretches = _stretches;
+    if (_timeline != nullptr) {
+        for (const Stretch& stretch : _timeline->stretches()) {
+            span.stretches.push_back({stretch.first, stretch.latest});
+        }
     }
-    const auto& stretches = _timeline->stretches();
-    TimeSpan span{stretches.front().first, stretches.front().latest};
-    for (const Stretch& stretch : stretches) {
-        span.end = std::max(*span.end, stretch.latest);
+    span.begin = span.stretches.front().begin;
+    span.end = span.begin;
+    for (const TimeSpan::Stretch& stretch : span.stretches) {
+        span.end = std::max(*span.end, stretch.end);
     }
     return span;
+}
+
+/// Nothing before the start.
+std::optional<ViewedFile::Place>
+ViewedFile::findBeforeEnd(std::chrono::nanoseconds distance,
+                          const std::vector<TimeSpan::Stretch>& stretches) {
+    for (std::size_t index = stretches.size(); index-- > 0;) {
+        const TimeSpan::Stretch& stretch = stretches[index];
+        const auto length = stretch.end - stretch.begin;
+        if (distance <= length) {
+            return Place{index, stretch.end - distance};
+        }
+        distance -= length;
+    }
+    return std::nullopt;
+}
+
+Result<ViewedFile::Place, NotSeen> ViewedFile::find(const TimeText& text,
+                                                    const ZoneRule& zone) const {
+    const TimeSpan span = this->span();
+    if (const auto distance = text.beforeEnd()) {
+        if (const auto place = findBeforeEnd(*distance, span.stretches)) {
+            return *place;
+        }
+        return NotSeen{_name + ": " + text.errorOutside(span, zone).sentence};
+    }
+    const auto time = text.timeIn(span, zone);
+    if (!time) {
+        return NotSeen{_name + ": " + time.error().sentence};
+    }
+    for (std::size_t index = 0; index < span.stretches.size(); ++index) {
+        if (span.stretches[index].begin <= *time && *time <= span.stretches[index].end) {
+            return Place{index, *time};
+        }
+    }
+    return NotSeen{_name + ": " + text.errorOutside(span, zone).sentence};
+}
+
+Moment ViewedFile::end() {
+    if (_timeline == nullptr) {
+        return {_displays.back().values, _displays.back().time};
+    }
+    const std::uint64_t packets = _timeline->packets();
+    return {_timeline->valuesAt(packets), _timeline->stretches().back().latest, packets};
 }
 
 Result<Moment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text, const ZoneRule& zone) {
     if (_timeline != nullptr && _timeline->packets() == 0) {
         return NotSeen{formatText("%@ holds no packets.", {_name}), true};
     }
-    std::optional<Time> time;
-    if (text) {
-        const auto found = text->timeIn(span(), zone);
-        if (!found) {
-            return NotSeen{_name + ": " + found.error().sentence};
-        }
-        time = *found;
+    if (!text || text->isEnd()) {
+        return end();
     }
-    if (_timeline == nullptr) {
-        const Display* latest = nullptr;
-        for (const Display& display : _displays) {
-            latest = !time || display.time <= *time ? &display : latest;
-        }
-        return latest != nullptr
-                   ? Result<Moment, NotSeen>(Moment{latest->values, latest->time})
-                   : NotSeen{formatText(
-                         "%@: every display is later than the time that is asked for.", {_name})};
+    const auto place = find(*text, zone);
+    if (!place) {
+        return place.error();
     }
-    Timeline& timeline = *_timeline;
-    if (!time) {
-        return Moment{timeline.valuesAt(timeline.packets()), timeline.stretches().back().latest,
-                      timeline.packets()};
+    if (_timeline != nullptr) {
+        const std::uint64_t instant =
+            _timeline->instantIn(_timeline->stretches()[place->stretch], place->time);
+        return Moment{_timeline->valuesAt(instant), place->time, instant};
     }
-    const auto instant = timeline.instantAt(*time);
-    if (!instant) {
-        return NotSeen{formatText(kTooEarly, {_name})};
+    const Display* latest = nullptr;
+    for (const Display& display : _displays) {
+        const bool isBefore = display.stretch == place->stretch && display.time <= place->time;
+        latest = isBefore ? &display : latest;
     }
-    return Moment{timeline.valuesAt(*instant), std::min(*time, timeline.stretchOf(*time)->latest),
-                  *instant};
+    return Moment{latest->values, latest->time};
 }
 
 std::vector<std::string> ViewedFile::notes() const {

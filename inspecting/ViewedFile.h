@@ -5,6 +5,8 @@
 #include "text/TimeText.h"
 #include "timeline/CurrentValues.h"
 
+#include <chrono>
+#include <cstddef>
 #include <memory>
 #include <optional>
 #include <string>
@@ -39,7 +41,10 @@ public:
     /// The packets that a live session, which must outlive the file, has received.
     static Result<std::unique_ptr<ViewedFile>, NotSeen> of(LiveSession& session);
 
-    /// At that time, or at the end. In a snapshot: the latest display that is not later.
+    /// At that time, or at the end, which is that of the last packet even if the clock was set
+    /// back before it. A time is looked for in the first stretch that has it; one that is counted
+    /// from the end goes back through the stretches. In a snapshot: the latest display that is not
+    /// later.
     Result<Moment, NotSeen> at(const std::optional<TimeText>& time, const ZoneRule& zone);
 
     const std::string& name() const { return _name; }
@@ -50,13 +55,23 @@ public:
 private:
     struct Display {
         Time time;
+        std::size_t stretch;
         CurrentValues values;
+    };
+    /// A time in one of the stretches.
+    struct Place {
+        std::size_t stretch;
+        Time time;
     };
 
     ViewedFile() = default;
     static Result<std::unique_ptr<ViewedFile>, NotSeen>
     openSnapshot(Recording& recording, const DecoderEnvironment& environment);
     TimeSpan span() const;
+    Result<Place, NotSeen> find(const TimeText& time, const ZoneRule& zone) const;
+    static std::optional<Place> findBeforeEnd(std::chrono::nanoseconds distance,
+                                              const std::vector<TimeSpan::Stretch>& stretches);
+    Moment end();
 
     std::string _name;
     const RecordedTechnology* _technology = nullptr;
@@ -65,7 +80,8 @@ private:
     Timeline* _timeline = nullptr;               ///< null: it is a snapshot
     std::unique_ptr<FieldTable> _fields;         ///< of a snapshot
     EntryTable _entries;
-    std::vector<Display> _displays; ///< oldest first
+    std::vector<Display> _displays;            ///< oldest first
+    std::vector<TimeSpan::Stretch> _stretches; ///< of the displays
 };
 
 } // namespace pallax

@@ -309,10 +309,18 @@ Result<Time, TimeTextError> TimeText::clockIn(const TimeSpan& span, const ZoneRu
     if (const auto time = firstIn(whole, zone)) { // between stretches
         return *time;
     }
+    return errorOutside(span, zone);
+}
+
+TimeTextError TimeText::errorOutside(const TimeSpan& span, const ZoneRule& zone) const {
+    Time begin = span.begin;
+    for (const TimeSpan::Stretch& stretch : span.stretches) {
+        begin = std::min(begin, stretch.begin);
+    }
     const auto local = [&zone](Time time) { return localDateText(time, zone(time)); };
     return TimeTextError{formatText("\"%@\" is no time of the recording, which lasts from %@ "
                                     "to %@.",
-                                    {_text, local(whole.begin), local(whole.end)}),
+                                    {_text, local(begin), local(span.end.value_or(kLatestTime))}),
                          0};
 }
 

@@ -56,9 +56,15 @@ public:
     /// Whether it is the same time in every recording.
     bool isAbsolute() const { return _kind == Kind::Local || _kind == Kind::Utc; }
     /// Whether it is the end of the recording.
-    bool isEnd() const { return _kind == Kind::BeforeEnd && _size.count() == 0; }
+    bool isEnd() const { return beforeEnd() == std::chrono::nanoseconds(0); }
+    /// How long before the end of the recording it is; nothing if it is not counted from there.
+    std::optional<std::chrono::nanoseconds> beforeEnd() const {
+        return _kind == Kind::BeforeEnd ? std::optional(_size) : std::nullopt;
+    }
     /// Whether `timeIn` depends on the end of the recording.
     bool needsEnd() const { return _kind == Kind::BeforeEnd || _kind == Kind::Clock; }
+    /// The error for a time that lies in no part of the recording, whose end is known.
+    TimeTextError errorOutside(const TimeSpan& span, const ZoneRule& zone) const;
 
 private:
     friend class TimeTextParser;

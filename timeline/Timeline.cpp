@@ -47,14 +47,14 @@ const Stretch* Timeline::stretchOf(Time time) const {
 
 std::optional<std::uint64_t> Timeline::instantAt(Time time) const {
     const Stretch* stretch = stretchOf(time);
-    if (stretch == nullptr) {
-        return std::nullopt;
-    }
-    const auto& frames = _keyFrames.all();
-    std::uint64_t instant = stretch->firstPacket;
+    return stretch != nullptr ? std::optional(instantIn(*stretch, time)) : std::nullopt;
+}
+
+std::uint64_t Timeline::instantIn(const Stretch& stretch, Time time) const {
+    std::uint64_t instant = stretch.firstPacket;
     const std::uint64_t end =
-        stretch == &_stretches.back() ? _packets : (stretch + 1)->firstPacket - 1;
-    for (const TimelineKeyFrame& frame : frames) {
+        &stretch == &_stretches.back() ? _packets : (&stretch + 1)->firstPacket - 1;
+    for (const TimelineKeyFrame& frame : _keyFrames.all()) {
         if (frame.packet > end) {
             break;
         }

@@ -66,6 +66,8 @@ public:
     /// The latest packets of the first stretch that has this time: all until the first one that is
     /// later. Nothing before the first packet.
     std::optional<std::uint64_t> instantAt(Time time) const;
+    /// The same in one of the stretches, which has begun by then.
+    std::uint64_t instantIn(const Stretch& stretch, Time time) const;
     /// The stretch in which a time is looked for: the first that has it, or else the one that ends
     /// latest before it; null before the first packet.
     const Stretch* stretchOf(Time time) const;

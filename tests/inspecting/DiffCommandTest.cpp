@@ -82,6 +82,12 @@ TEST_F(DiffCommandTest, NothingIsWrittenWhereNothingDiffers) {
     EXPECT_EQ(reports, Sentences());
 }
 
+TEST_F(DiffCommandTest, TheEndIsThatOfTheLastPacketWhereTheClockWasSetBack) {
+    const std::string path = driveSetBack();
+    EXPECT_EQ(run(path + "@end", path), kExitSuccess) << written;
+    EXPECT_EQ(run(path + "@-60s", path + "@end"), kExitFailure);
+}
+
 TEST_F(DiffCommandTest, OfTwoFilesTheAnswerIsThatOfOne) {
     const std::string again = copy("lte-drive.pcap", "again.pcap");
     options.json = true;
@@ -137,8 +143,13 @@ TEST_F(DiffCommandTest, WhatCannotBeComparedCannotBeTold) {
     EXPECT_EQ(reports, Sentences{"/no/such.pcap cannot be opened: No such file or directory."});
     EXPECT_EQ(run("/no/such.pcap", lte), kExitCouldNotTell);
     EXPECT_EQ(run(lte + "@2020-01-01", lte), kExitCouldNotTell);
-    EXPECT_EQ(reports, Sentences{lte + ": every packet is later than the time that is asked for."});
-    EXPECT_EQ(run(lte, lte + "@03:00"), kExitCouldNotTell);
+    const std::string outside = " is no time of the recording, which lasts from 2023-11-14 "
+                                "22:13:20 to 2023-11-14 22:15:19.";
+    EXPECT_EQ(reports, Sentences{lte + ": \"2020-01-01\"" + outside});
+    for (const std::string time : {"03:00", "22:19", "+301s", "2023-11-14T22:19"}) {
+        EXPECT_EQ(run(lte, lte + "@" + time), kExitCouldNotTell);
+        EXPECT_EQ(reports, Sentences{lte + ": \"" + time + "\"" + outside});
+    }
     EXPECT_EQ(written, "");
 }
 

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Technologies/Technologies.h"
 #include "host/DirectoryResources.h"
+#include "host/RecordingWriter.h"
 #include "plist/PropertyListCodec.h"
 #include "querying/RecordedTimeline.h"
 #include "tests/doubles/FakeBundle.h"
@@ -26,6 +27,25 @@ protected:
     }
     static TimeText time(std::string_view text) { return *TimeText::parse(text); }
 
+    /// The drive from 22:13:20 to 22:15:19, whose clock is then set back: its first 40 s come again
+    /// with the times from 21:43:20 to 21:44:00.
+    std::string driveSetBack() {
+        const std::string path = folder.file("set-back.pcap");
+        const std::string drive = sample("lte-drive.pcap");
+        const auto technology = (*Recording::open(drive))->linkType();
+        const auto writer = RecordingWriter::create(path, technology);
+        for (const auto back : {std::chrono::minutes(0), std::chrono::minutes(30)}) {
+            const auto recording = Recording::open(drive);
+            std::optional<Time> end;
+            while (const auto packet = (*recording)->next()) {
+                end = end.value_or(packet->time + std::chrono::seconds(40));
+                if (back.count() == 0 || packet->time <= *end) {
+                    EXPECT_FALSE((*writer)->write(packet->time - back, packet->data));
+                }
+            }
+        }
+        return path;
+    }
     /// A saved snapshot with a display for each text of a time.
     std::string snapshot(const std::vector<std::pair<std::string, Dictionary>>& displays) {
         Array data;
