@@ -1,6 +1,5 @@
 #include "inspecting/ViewedFile.h"
 
-#include "host/RecordingFile.h"
 #include "host/Snapshot.h"
 #include "live/LiveSession.h"
 #include "overview/DisplayValues.h"
@@ -27,23 +26,24 @@ PropertyList displayIn(Bytes message) {
 Result<std::unique_ptr<ViewedFile>, NotSeen>
 ViewedFile::open(const std::string& path, const RecordedTechnology* technology,
                  const DecoderEnvironment& environment, const BoundedJournal::Limits& journal) {
-    if (!RecordingFile::isStream(path)) { // a stream can be opened only once
-        const auto recording = Recording::open(path);
-        if (!recording) {
-            const RecordingError& error = recording.error();
-            return NotSeen{error.sentence, error.kind == RecordingError::Kind::Empty};
-        }
-        if ((*recording)->technology() == &kSnapshotTechnology) {
-            return openSnapshot(**recording, environment);
-        }
+    const auto recording = Recording::open(path);
+    if (!recording) {
+        const RecordingError& error = recording.error();
+        return NotSeen{error.sentence, error.kind == RecordingError::Kind::Empty};
     }
-    auto recorded = RecordedTimeline::open({{path}, technology, journal}, environment);
+    if ((*recording)->technology() == &kSnapshotTechnology) {
+        return openSnapshot(**recording, environment);
+    }
+    const RecordedTimeline::Request request{{path}, technology, journal};
+    auto recorded = (*recording)->isStream() // which can be opened only once
+                        ? RecordedTimeline::openStream(**recording, request, environment)
+                        : RecordedTimeline::open(request, environment);
     if (!recorded) {
         const RecordingError& error = recorded.error();
         return NotSeen{error.sentence, error.kind == RecordingError::Kind::Empty};
     }
     std::unique_ptr<ViewedFile> file(new ViewedFile);
-    file->_name = path == "-" ? "standard input" : path;
+    file->_name = (*recording)->name();
     file->_recorded = std::move(recorded).value();
     file->_timeline = &file->_recorded->timeline();
     file->_technology = technologyOfCommandName(file->_timeline->fields().technology());

@@ -15,6 +15,8 @@
 
 namespace pallax {
 
+class FileWatch;
+
 /// A recording, or several as one, that can be asked about any instant.
 class RecordedTimeline {
 public:
@@ -33,12 +35,25 @@ public:
     static Result<std::unique_ptr<RecordedTimeline>, RecordingError>
     open(const Request& request, const DecoderEnvironment& environment);
 
+    /// The same of a stream that has been opened; the request names it.
+    static Result<std::unique_ptr<RecordedTimeline>, RecordingError>
+    openStream(Recording& stream, const Request& request, const DecoderEnvironment& environment);
+
     Timeline& timeline() { return *_timeline; }
     /// Sentences about what is missing or damaged; empty if all is well.
     std::vector<std::string> notes() const;
 
 private:
+    struct OpenJournal;
+    using OpenResult = Result<OpenJournal, RecordingError>;
+
     RecordedTimeline() = default;
+    static OpenResult openFile(const std::string& path);
+    static OpenResult keep(const Request& request);
+    static OpenResult keep(Recording& recording, const std::vector<FileWatch>& files,
+                           const Request& request);
+    static Result<std::unique_ptr<RecordedTimeline>, RecordingError>
+    index(OpenJournal journal, const Request& request, const DecoderEnvironment& environment);
 
     std::unique_ptr<PacketJournal> _journal; // outlives the timeline
     std::unique_ptr<Timeline> _timeline;

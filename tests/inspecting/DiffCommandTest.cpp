@@ -128,6 +128,17 @@ TEST_F(DiffCommandTest, ASnapshotIsComparedWithARecording) {
                                                     "(+0.25 dB)\n");
 }
 
+TEST_F(DiffCommandTest, ASnapshotIsReadFromStandardInput) {
+    const std::string path =
+        snapshot({{"2023-11-14 22:13:20 +0000",
+                   {{"Serving Cell Measurements",
+                     Dictionary{{"Measured RSRP", "-94.75 dBm"}, {"Physical Cell ID", "1"}}}}}});
+    withInput(path, [&] { EXPECT_EQ(run("-", path), kExitSuccess); });
+    EXPECT_EQ(reports, Sentences());
+    withInput(path, [&] { EXPECT_EQ(run("-", lte), kExitFailure); });
+    EXPECT_TRUE(written.starts_with("before  standard input, 2023-11-14 22:13:20\n")) << written;
+}
+
 TEST_F(DiffCommandTest, AFileWhoseNameContainsTheMarkOfATimeIsFoundFirst) {
     const std::string path = copy("lte-drive.pcap", "drive@+40s");
     EXPECT_EQ(run(path, lte), kExitSuccess);

@@ -1,19 +1,25 @@
 #pragma once
 
 #include "LogGenerator/Technologies/Technologies.h"
+#include "host/Descriptor.h"
 #include "host/DirectoryResources.h"
 #include "host/RecordingWriter.h"
 #include "plist/PropertyListCodec.h"
 #include "querying/RecordedTimeline.h"
+#include "tests/doubles/Compression.h"
 #include "tests/doubles/FakeBundle.h"
 #include "tests/doubles/FakeStandardOutput.h"
+#include "tests/doubles/Files.h"
 #include "tests/doubles/ManualClock.h"
 #include "tests/doubles/RuntimeFolder.h"
 
 #include <gtest/gtest.h>
 
+#include <fcntl.h>
+#include <functional>
 #include <string>
 #include <string_view>
+#include <unistd.h>
 #include <utility>
 #include <vector>
 
@@ -56,6 +62,15 @@ protected:
         const auto bytes = serializeBinary(
             Dictionary{{"Timestamp", "now"}, {"Description", ""}, {"Data", std::move(data)}});
         return folder.write("saved.pallax", std::string(bytes->begin(), bytes->end()));
+    }
+
+    /// Reads a file as standard input while `action` runs.
+    static void withInput(const std::string& path, const std::function<void()>& action) {
+        const Descriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC));
+        const Descriptor kept(::dup(STDIN_FILENO));
+        ASSERT_GE(::dup2(file.number(), STDIN_FILENO), 0);
+        action();
+        (void)::dup2(kept.number(), STDIN_FILENO);
     }
 
     doubles::RuntimeFolder folder;

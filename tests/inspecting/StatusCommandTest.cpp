@@ -196,6 +196,24 @@ TEST_F(StatusCommandTest, OfASnapshotIsTheLatestDisplay) {
     EXPECT_EQ(reports, std::vector<std::string>{without + " is a snapshot without displays."});
 }
 
+TEST_F(StatusCommandTest, ASnapshotIsReadFromStandardInput) {
+    const std::string path =
+        snapshot({{"2023-11-14 22:13:20 +0000",
+                   {{"Serving Cell Info", Dictionary{{"Physical Cell ID", "182"}}},
+                    {"Neighbor Cells List", Array()}}}});
+    const std::string shown = "LTE · 2023-11-14 22:13:20 · standard input\ncell        PCI 182\n";
+    withInput(path, [&] { EXPECT_EQ(run("-"), kExitSuccess); });
+    EXPECT_EQ(written, shown);
+    const std::string compressed =
+        folder.write("saved.gz", doubles::gzipOf(doubles::contentOf(path)));
+    withInput(compressed, [&] { EXPECT_EQ(run("-"), kExitSuccess); });
+    EXPECT_EQ(written, shown);
+    withInput(snapshot({}), [&] { EXPECT_EQ(run("-"), kExitFailure); });
+    EXPECT_EQ(reports, std::vector<std::string>{"standard input is a snapshot without displays."});
+    withInput(sample("lte-drive.pcap"), [&] { EXPECT_EQ(run("-"), kExitSuccess); });
+    EXPECT_NE(written.find("PCI 184"), std::string::npos);
+}
+
 TEST_F(StatusCommandTest, TheTechnologyCanBeNamed) {
     options.technology = technologyOfCommandName("gsm");
     EXPECT_EQ(run(sample("lte-drive.pcap")), kExitSuccess);
