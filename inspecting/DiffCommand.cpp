@@ -8,6 +8,7 @@
 #include "fields/StatusFields.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
+#include "host/Snapshot.h"
 #include "host/WallClock.h"
 #include "inspecting/DiffText.h"
 #include "text/Format.h"
@@ -99,6 +100,10 @@ ExitStatus DiffCommand::compare(ViewedFile& before, const std::optional<TimeText
     if (!one || !other) {
         return refuse(one ? other.error().sentence : one.error().sentence);
     }
+    const bool mayBeLater = one->mayBeLater || other->mayBeLater;
+    if (mayBeLater) {
+        _environment.report(std::string(kSharedSections));
+    }
     if (const auto name = unknownField(one->values, other->values)) {
         return refuse(formatText("no field is named \"%@\"", {*name}), kExitWrongUsage);
     }
@@ -116,7 +121,10 @@ ExitStatus DiffCommand::compare(ViewedFile& before, const std::optional<TimeText
         appendDifferencesText(output.text(), differences);
     }
     output.flush();
-    return !notes.empty() ? kExitCouldNotTell : differences.empty() ? kExitSuccess : kExitFailure;
+    const bool areOfOneSnapshot = mayBeLater && &before == &after && one->time != other->time;
+    return !notes.empty() || areOfOneSnapshot ? kExitCouldNotTell
+           : differences.empty()              ? kExitSuccess
+                                              : kExitFailure;
 }
 
 /// A chosen name that no field has.

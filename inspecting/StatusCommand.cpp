@@ -9,6 +9,7 @@
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/KnowledgeFiles.h"
+#include "host/Snapshot.h"
 #include "host/UserFolders.h"
 #include "host/WallClock.h"
 #include "inspecting/StatusText.h"
@@ -50,6 +51,9 @@ ExitStatus StatusCommand::show(const Result<std::unique_ptr<ViewedFile>, NotSeen
     }
     if (!moment) {
         return refuse(moment.error());
+    }
+    if (moment->mayBeLater) {
+        _environment.report(std::string(kSharedSections));
     }
     const Status status =
         statusOf(moment->values, moment->time, _environment.names, _environment.profile);

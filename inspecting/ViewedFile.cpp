@@ -171,7 +171,7 @@ Result<Moment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text, cons
         const bool isBefore = display.stretch == place->stretch && display.time <= place->time;
         latest = isBefore ? &display : latest;
     }
-    return Moment{latest->values, latest->time};
+    return Moment{latest->values, latest->time, 0, latest != &_displays.back()};
 }
 
 std::vector<std::string> ViewedFile::notes() const {

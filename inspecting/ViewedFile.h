@@ -28,6 +28,9 @@ struct Moment {
     CurrentValues values; ///< valid as long as the file
     Time time;
     std::uint64_t packet = 0; ///< 0 in a snapshot
+    /// Whether it is a display of a snapshot that later ones may have changed, because they share
+    /// sections.
+    bool mayBeLater = false;
 };
 
 /// A recording or a saved snapshot whose values can be seen at any of its times.

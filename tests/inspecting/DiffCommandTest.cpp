@@ -102,18 +102,40 @@ TEST_F(DiffCommandTest, CountersAndHiddenFieldsAreComparedOnRequest) {
         return Dictionary{{"Connected mode LTE Intra-frequency Measurement",
                            Dictionary{{"Subframe Number", number}}}};
     };
-    const std::string path = snapshot({{"2023-11-14 22:13:20 +0000", counters("1")},
-                                       {"2023-11-14 22:13:22 +0000", counters("2")}});
-    EXPECT_EQ(run(path + "@22:13:20", path), kExitSuccess);
+    const std::string before = folder.file("before.pallax");
+    std::filesystem::rename(snapshot({{"2023-11-14 22:13:20 +0000", counters("1")}}), before);
+    const std::string after = snapshot({{"2023-11-14 22:13:22 +0000", counters("2")}});
+    EXPECT_EQ(run(before, after), kExitSuccess);
     options.all = true;
-    EXPECT_EQ(run(path + "@22:13:20", path), kExitFailure);
-    EXPECT_EQ(written, "before  " + path + ", 2023-11-14 22:13:20\n" + "after   " + path +
+    EXPECT_EQ(run(before, after), kExitFailure);
+    EXPECT_EQ(written, "before  " + before + ", 2023-11-14 22:13:20\n" + "after   " + after +
                            ", 2023-11-14 22:13:22\n\n"
                            "Connected mode LTE Intra-frequency Measurement\n"
                            "  Subframe Number  1 → 2\n");
     options.all = false;
     options.select = {"*.subframe_number"};
-    EXPECT_EQ(run(path + "@22:13:20", path), kExitFailure);
+    EXPECT_EQ(run(before, after), kExitFailure);
+}
+
+TEST_F(DiffCommandTest, DisplaysOfOneSnapshotMayShareSections) {
+    const auto serving = [](const char* pci) {
+        return Dictionary{{"Serving Cell Info", Dictionary{{"Physical Cell ID", pci}}},
+                          {"Neighbor Cells List", Array()}};
+    };
+    const std::string path = snapshot({{"2023-11-14 22:13:20 +0000", serving("182")},
+                                       {"2023-11-14 22:13:22 +0000", serving("183")}});
+    const Sentences shared{
+        "Displays that share a section all show it as it was when the snapshot was saved."};
+    EXPECT_EQ(run(path + "@22:13:20", path), kExitCouldNotTell);
+    EXPECT_EQ(reports, shared);
+    EXPECT_NE(written.find("Physical Cell ID  182 → 183"), std::string::npos) << written;
+    EXPECT_EQ(run(path + "@22:13:20", path + "@+1s"), kExitSuccess) << "one display";
+    EXPECT_EQ(reports, shared);
+    EXPECT_EQ(run(path + "@22:13:22", path), kExitSuccess);
+    EXPECT_EQ(reports, Sentences());
+    options.select = {"lte.serving_cell_info.physical_cell_id"};
+    EXPECT_EQ(run(path + "@22:13:20", lte), kExitFailure);
+    EXPECT_EQ(reports, shared);
 }
 
 TEST_F(DiffCommandTest, ASnapshotIsComparedWithARecording) {
