@@ -1,5 +1,6 @@
 #include "query/Database.h"
 
+#include "query/Printf.h"
 #include "query/Quantile.h"
 #include "query/QueryTable.h"
 #include "query/VirtualTable.h"
@@ -183,7 +184,7 @@ Database::Database() : _authority(std::make_unique<Authority>()), _schemas{"main
     run(*connection, "PRAGMA temp_store = memory");
     // Opens them while that is allowed; later they only read.
     run(*connection, "SELECT 1 FROM json_each('[]'), json_tree('[]')");
-    if (!addQuantile(*connection)) {
+    if (!addQuantile(*connection) || !addPrintf(*connection)) {
         throw std::runtime_error(sqlite3_errmsg(connection));
     }
 }

@@ -214,6 +214,24 @@ TEST_F(DatabaseTest, SortsInABoundedMemory) {
     EXPECT_EQ(ask("select count(*) from (select * from numbers order by name desc)"), Lines{"10"});
 }
 
+TEST_F(DatabaseTest, ATextThatIsTooLongIsAnErrorOfTheQuery) {
+    for (const char* text : {"printf('%.*c', 2000000000, 'x')", "printf('%.2000000000c', 'x')",
+                             "format('%d%.*c', 1, -2147483647, 'x')", "printf('%20000000d', 1)",
+                             "printf('%s%s', hex(zeroblob(8000000)), hex(zeroblob(8000000)))"}) {
+        EXPECT_EQ(ask(std::string("select length(") + text + ")"), Lines{"string or blob too big"})
+            << text;
+    }
+    EXPECT_EQ(
+        ask("select length(printf('%.*c', 10000000, 'x')), printf('%.*s', 2000000000, 'abc')"),
+        Lines{"10000000|abc"});
+    EXPECT_EQ(ask("select printf('%05.1f%%|%-*d|%s', 2.25, 4, 7, 'x'), format('a'), printf('%s')"),
+              Lines{"002.3%|7   |x|a|"});
+    EXPECT_EQ(ask("select printf(''), printf('%s', ''), printf(null, 1), printf()"),
+              Lines{"NULL||NULL|NULL"});
+    EXPECT_EQ(ask("select group_concat(printf('%d', number), ' ') from numbers where number < 4"),
+              Lines{"1 2 3"});
+}
+
 TEST_F(DatabaseTest, ReadsJson) {
     EXPECT_EQ(ask("select key, value from json_each('[5,7]')"), (Lines{"0|5", "1|7"}));
     EXPECT_EQ(ask("select value from json_tree('{\"a\":[1]}') where atom = 1"), Lines{"1"});
