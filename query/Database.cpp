@@ -2,6 +2,7 @@
 
 #include "query/Printf.h"
 #include "query/Quantile.h"
+#include "query/QueryMemory.h"
 #include "query/QueryTable.h"
 #include "query/VirtualTable.h"
 
@@ -13,8 +14,6 @@ namespace pallax {
 
 namespace {
 
-/// Of the memory of all queries, sorting included. SQLite writes no temporary file.
-constexpr sqlite3_int64 kMostMemory = sqlite3_int64{512} << 20U;
 /// Of a text or a query.
 constexpr int kLongestText = 16 << 20;
 constexpr int kStepsBetweenQuestions = 4000;
@@ -59,7 +58,7 @@ QueryError errorOf(sqlite3& connection) {
     const int code = sqlite3_errcode(&connection);
     std::string sentence = code == SQLITE_AUTH        ? kOnlyReading
                            : code == SQLITE_INTERRUPT ? kStopped
-                           : code == SQLITE_NOMEM ? "The query needs more than 512 MiB of memory."
+                           : code == SQLITE_NOMEM ? "The query needs more than 256 MiB of memory."
                                                   : sqlite3_errmsg(&connection);
     return {std::move(sentence),
             place >= 0 ? std::optional(static_cast<std::size_t>(place)) : std::nullopt};
@@ -171,6 +170,7 @@ void Database::Close::operator()(sqlite3* connection) const {
 }
 
 Database::Database() : _authority(std::make_unique<Authority>()), _schemas{"main"} {
+    limitQueryMemory();
     sqlite3* connection = nullptr;
     const int result = sqlite3_open_v2(":memory:", &connection,
                                        SQLITE_OPEN_READWRITE | SQLITE_OPEN_MEMORY, nullptr);
@@ -178,7 +178,6 @@ Database::Database() : _authority(std::make_unique<Authority>()), _schemas{"main
     if (result != SQLITE_OK) {
         throw std::runtime_error("no memory for queries");
     }
-    sqlite3_hard_heap_limit64(kMostMemory);
     sqlite3_limit(connection, SQLITE_LIMIT_LENGTH, kLongestText);
     sqlite3_limit(connection, SQLITE_LIMIT_SQL_LENGTH, kLongestText);
     run(*connection, "PRAGMA temp_store = memory");

@@ -1,6 +1,8 @@
 #include "query/QueryTable.h"
 #include "tests/query/QueryFixture.h"
 
+#include <malloc.h>
+
 namespace pallax {
 namespace {
 
@@ -210,8 +212,27 @@ TEST_F(DatabaseTest, SortsInABoundedMemory) {
         ask("with recursive c(n) as (select 1 union all select n + 1 from c limit 1000) select "
             "sum(length(x)) from (select hex(zeroblob(300000)) || n as x from c order by x limit "
             "2000)");
-    EXPECT_EQ(answer, Lines{"The query needs more than 512 MiB of memory."});
+    EXPECT_EQ(answer, Lines{"The query needs more than 256 MiB of memory."});
     EXPECT_EQ(ask("select count(*) from (select * from numbers order by name desc)"), Lines{"10"});
+}
+
+TEST_F(DatabaseTest, SmallRowsAreCountedWithTheRoomAroundThem) {
+    const auto used = [] {
+        const auto info = ::mallinfo2();
+        return info.uordblks + info.hblkhd;
+    };
+    const std::size_t before = used();
+    std::size_t most = before;
+    int asked = 0;
+    _database.setMayContinue([&] {
+        constexpr int kBetween = 200; // mallinfo2() looks at all free blocks
+        most = ++asked % kBetween == 0 ? std::max(most, used()) : most;
+        return true;
+    });
+    const Lines answer = ask("with recursive c(n) as (select 1 union all select n + 1 from c limit "
+                             "20000000) select 'abcd' from c order by random() limit 20000000");
+    EXPECT_EQ(answer, Lines{"The query needs more than 256 MiB of memory."});
+    EXPECT_LT(most - before, std::size_t{345} << 20U);
 }
 
 TEST_F(DatabaseTest, ATextThatIsTooLongIsAnErrorOfTheQuery) {
