@@ -41,6 +41,22 @@ SqlToken quoted(std::string_view text, SqlToken token) {
     return token;
 }
 
+/// What closes a comment, text or name with that first character.
+std::string_view closingOf(char first) {
+    switch (first) {
+    case '/':
+        return "*/";
+    case '[':
+        return "]";
+    case '"':
+        return "\"";
+    case '`':
+        return "`";
+    default:
+        return "'";
+    }
+}
+
 std::size_t wordEnd(std::string_view text, std::size_t place) {
     while (place < text.size() &&
            (isInWord(text[place]) ||
@@ -85,13 +101,25 @@ std::optional<SqlToken> sqlTokenAt(std::string_view text, std::size_t place) {
     return SqlToken{SqlToken::Kind::Symbol, place, place + 1};
 }
 
-std::optional<std::size_t> statementEnd(std::string_view text) {
-    std::size_t place = 0;
-    while (const auto token = sqlTokenAt(text, place)) {
+std::optional<std::size_t> StatementSearch::end(std::string_view text) {
+    if (!_closing.empty()) {
+        const std::size_t found = text.find(_closing, _place);
+        if (found == std::string_view::npos) {
+            _place = text.size();
+            return std::nullopt;
+        }
+        _place = found + _closing.size();
+        _closing = {};
+    }
+    while (const auto token = sqlTokenAt(text, _place)) {
         if (text[token->begin] == ';') {
             return token->end;
         }
-        place = token->end;
+        _place = token->end;
+        if (!token->isClosed) {
+            _closing = closingOf(text[token->begin]);
+            break;
+        }
     }
     return std::nullopt;
 }

@@ -24,8 +24,18 @@ struct SqlToken {
 /// The token at a place of a text; nothing at its end.
 std::optional<SqlToken> sqlTokenAt(std::string_view text, std::size_t place);
 
-/// The end of the first statement in the text, after its semicolon; nothing if it is not there yet.
-std::optional<std::size_t> statementEnd(std::string_view text);
+/// Looks for the end of the first statement in a text that grows by whole lines. Each search goes
+/// on where the last one ended.
+class StatementSearch {
+public:
+    /// The end, after its semicolon; nothing if it is not there yet.
+    std::optional<std::size_t> end(std::string_view text);
+
+private:
+    std::size_t _place = 0;
+    std::string_view _closing; ///< of a comment, text or name that is open there
+};
+
 /// Whether there is nothing but blanks, comments and semicolons.
 bool isEmptyStatement(std::string_view text);
 

@@ -2,7 +2,6 @@
 
 #include "console/Output.h"
 #include "query/QueryTable.h"
-#include "query/SqlTokens.h"
 #include "querying/LineReader.h"
 #include "querying/QueryRun.h"
 #include "text/Format.h"
@@ -68,7 +67,7 @@ ExitStatus SqlShell::run() {
             take(line);
             break;
         case LineReader::Outcome::Cleared:
-            _pending.clear();
+            clearPending();
             break;
         case LineReader::Outcome::End:
             _hasEnded = true;
@@ -88,6 +87,11 @@ ExitStatus SqlShell::run() {
     return _status;
 }
 
+void SqlShell::clearPending() {
+    _pending.clear();
+    _search = {};
+}
+
 void SqlShell::take(const std::string& line) {
     if (_pending.empty() && withoutBlanks(line).starts_with('.')) {
         _lines.remember(withoutBlanks(line));
@@ -98,27 +102,30 @@ void SqlShell::take(const std::string& line) {
     }
     _pending.append(_pending.empty() ? "" : "\n").append(line);
     if (_pending.size() > kLongestStatement) {
-        _pending.clear();
+        clearPending();
         return fail("The query is longer than 1 MiB.");
     }
     runStatements();
 }
 
 void SqlShell::runStatements() {
+    bool hasEndedOne = false;
     while (!_hasEnded) {
-        const auto end = statementEnd(_pending);
+        const auto end = _search.end(_pending);
         if (!end) {
             break;
         }
+        hasEndedOne = true;
         const std::string statement = _pending.substr(0, *end);
         _pending.erase(0, *end);
+        _search = {};
         if (!isEmptyStatement(statement)) {
             _lines.remember(statement);
             runQuery(statement);
         }
     }
-    if (isEmptyStatement(_pending)) {
-        _pending.clear();
+    if (hasEndedOne && isEmptyStatement(_pending)) {
+        clearPending();
     }
 }
 

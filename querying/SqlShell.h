@@ -1,6 +1,7 @@
 #pragma once
 
 #include "console/ExitStatus.h"
+#include "query/SqlTokens.h"
 #include "querying/RowWriter.h"
 
 #include <string>
@@ -28,6 +29,7 @@ public:
     static const std::vector<std::string>& commands();
 
 private:
+    void clearPending();
     void take(const std::string& line);
     void runStatements();
     void runCommand(const std::string& line);
@@ -43,7 +45,8 @@ private:
     LineReader& _lines;
     RowFormat _format;
     Errors _errors;
-    std::string _pending; ///< the lines of a statement that has not ended
+    std::string _pending;    ///< the lines of a statement that has not ended
+    StatementSearch _search; ///< in these lines
     ExitStatus _status = kExitSuccess;
     bool _hasEnded = false;
     bool _hasRun = false;

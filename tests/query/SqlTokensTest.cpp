@@ -23,7 +23,20 @@ TEST(SqlTokens, AStatementEndsAtASemicolonOutsideOfTexts) {
         {"", std::nullopt},
     };
     for (const auto& [text, end] : ends) {
-        EXPECT_EQ(statementEnd(text), end) << text;
+        EXPECT_EQ(StatementSearch().end(text), end) << text;
+    }
+}
+
+TEST(SqlTokens, AStatementCanGrowByLines) {
+    for (const char* text : {"select\n1\n;", "select 'a\n;''b\n'';\n' ;", "a [\n;\n] /*\n;\n*/ ;",
+                             "\"a\n\" -- ;\n ;", "`\n;`;", "a -\n- 1 /\n* 2\n;"}) {
+        const std::string_view all = text;
+        StatementSearch search;
+        for (std::size_t end = all.find('\n'); end != std::string_view::npos;
+             end = all.find('\n', end + 1)) {
+            EXPECT_EQ(search.end(all.substr(0, end)), std::nullopt) << all.substr(0, end);
+        }
+        EXPECT_EQ(search.end(all), all.size()) << all;
     }
 }
 

@@ -161,6 +161,17 @@ TEST_F(SqlShellTest, AStatementHasALimit) {
     EXPECT_EQ(told, Lines{"The query is longer than 1 MiB."});
 }
 
+TEST_F(SqlShellTest, LinesWithoutAnEndAreReadOnce) {
+    for (const char* first : {"y", "select 'y", "y /*"}) {
+        const auto start = std::chrono::steady_clock::now();
+        Lines lines(kLongestStatement / 2 + 1, "y");
+        lines.front() = first;
+        EXPECT_EQ(run(std::move(lines), SqlShell::Errors::End), kExitWrongUsage);
+        EXPECT_EQ(told, Lines{"The query is longer than 1 MiB."});
+        EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(10)) << first;
+    }
+}
+
 TEST_F(SqlShellTest, AQueryIsStoppedAfterItsTime) {
     request.most = std::chrono::milliseconds(2500);
     const std::string endless = "with recursive c(x) as (select 1 union all select x + 1 from c) "
