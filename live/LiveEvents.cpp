@@ -2,16 +2,26 @@
 
 #include "console/ScopedLog.h"
 #include "decoding/EventsCommand.h"
+#include "decoding/InstalledKnowledge.h"
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/LogSinks.h"
 #include "link/Settings.h"
 #include "link/WaitNotice.h"
 #include "live/LiveRecording.h"
+#include "query/Condition.h"
 
 namespace pallax {
 
 ExitStatus runLiveEvents(EventsOptions options) {
+    // The modem may keep the user waiting, and tells the fields only then.
+    const auto wrong = options.where
+                           ? QueryCondition::errorBeforeFields(*options.where, installedKnowledge())
+                           : std::nullopt;
+    if (wrong) {
+        complain("--where: " + *wrong);
+        return kExitWrongUsage;
+    }
     const Interruption interruption;
     const SettingsResult settings = loadSettings(settingsFiles());
     if (!settings) {

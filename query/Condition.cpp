@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <optional>
+#include <stdexcept>
 
 namespace pallax {
 
@@ -16,10 +17,45 @@ namespace {
 
 constexpr std::string_view kOfAge = "_age";
 constexpr std::size_t kMostLateFields = 64;
+constexpr std::string_view kUnknown = "no such column: ";
+// An expression, and nothing else, can be the argument of CAST, which keeps its truth.
+constexpr std::string_view kBefore = "SELECT 1 FROM state WHERE CAST(";
+constexpr std::string_view kAfter = "\nAS NUMERIC)";
+
+Result<Query, QueryError> prepareCondition(Database& database, const std::string& written) {
+    auto query = database.prepare(std::string(kBefore) + written + std::string(kAfter));
+    if (query) {
+        return query;
+    }
+    QueryError error = query.error();
+    if (error.place) {
+        *error.place -= std::min(*error.place, kBefore.size());
+    }
+    return error;
+}
+
+std::string conditionErrorText(QueryError error, std::string_view text, const Database& database) {
+    if (error.place && *error.place >= text.size()) {
+        error = {"This is not a whole condition.", std::nullopt};
+    }
+    return queryErrorText(error, text, database.names(), "condition");
+}
+
+/// A row without fields.
+class NoFields final : public QueryTable {
+public:
+    const std::vector<Column>& columns() const override {
+        static const std::vector<Column> columns = {{"time", "INTEGER"}};
+        return columns;
+    }
+    double expectedRows() const override { return 0; }
+    std::unique_ptr<Rows> rows(const RowBounds& /*bounds*/) override {
+        throw std::logic_error("a condition without fields is not asked");
+    }
+};
 
 /// The name of a field that may come, as it is written in a column; empty if it cannot be one.
 std::string lateName(const QueryError& error) {
-    constexpr std::string_view kUnknown = "no such column: ";
     constexpr std::string_view kTable = "state.";
     std::string name = error.sentence.starts_with(kUnknown) ? error.sentence.substr(kUnknown.size())
                                                             : std::string();
@@ -170,9 +206,6 @@ QueryCondition::~QueryCondition() = default;
 Result<std::unique_ptr<QueryCondition>, std::string>
 QueryCondition::compile(std::string_view text, const FieldTable& fields, About about,
                         const QueryKnowledge& knowledge) {
-    // An expression, and nothing else, can be the argument of CAST, which keeps its truth.
-    constexpr std::string_view kBefore = "SELECT 1 FROM state WHERE CAST(";
-    constexpr std::string_view kAfter = "\nAS NUMERIC)";
     const std::string technology =
         fields.size() > 0 ? fields[0].name.substr(0, fields[0].name.find('.') + 1) : std::string();
     std::vector<std::string> late;
@@ -185,31 +218,40 @@ QueryCondition::compile(std::string_view text, const FieldTable& fields, About a
         const auto columnOf = [&](std::string_view name) {
             return parts->row->columnOf(name, technology);
         };
-        const auto sentence = [&](QueryError error) {
-            if (error.place && *error.place >= text.size()) {
-                error = {"This is not a whole condition.", std::nullopt};
-            }
-            return queryErrorText(error, text, parts->database.names(), "condition");
+        const auto sentence = [&](const QueryError& error) {
+            return conditionErrorText(error, text, parts->database);
         };
         const auto written = conditionText(text, columnOf);
         if (!written) {
             return sentence(written.error());
         }
-        auto query = parts->database.prepare(std::string(kBefore) + *written + std::string(kAfter));
+        auto query = prepareCondition(parts->database, *written);
         if (query) {
             parts->query = std::move(query).value();
             return std::unique_ptr<QueryCondition>(new QueryCondition(std::move(parts)));
         }
         const std::string name = fields.isObjectStream() ? lateName(query.error()) : std::string();
         if (name.empty() || late.size() == kMostLateFields) {
-            QueryError error = query.error();
-            if (error.place) {
-                *error.place -= std::min(*error.place, kBefore.size());
-            }
-            return sentence(std::move(error));
+            return sentence(query.error());
         }
         late.push_back(name);
     }
+}
+
+std::optional<std::string> QueryCondition::errorBeforeFields(std::string_view text,
+                                                             const QueryKnowledge& knowledge) {
+    Database database;
+    database.add("main", "state", std::make_unique<NoFields>());
+    addFunctions(database, knowledge);
+    const auto written =
+        conditionText(text, [](std::string_view) { return std::optional<std::string>(); });
+    if (!written) {
+        return conditionErrorText(written.error(), text, database);
+    }
+    const auto query = prepareCondition(database, *written);
+    return query || query.error().sentence.starts_with(kUnknown)
+               ? std::nullopt
+               : std::optional(conditionErrorText(query.error(), text, database));
 }
 
 Result<bool, std::string> QueryCondition::holds(const Moment& moment, const CurrentValues& values) {

@@ -5,6 +5,7 @@
 #include "text/Result.h"
 
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -31,6 +32,10 @@ public:
     static Result<std::unique_ptr<QueryCondition>, std::string>
     compile(std::string_view text, const FieldTable& fields, About about,
             const QueryKnowledge& knowledge);
+    /// What is wrong with a condition as far as it shows before the fields are known: anything but
+    /// a name of a column.
+    static std::optional<std::string> errorBeforeFields(std::string_view text,
+                                                        const QueryKnowledge& knowledge);
     ~QueryCondition();
     QueryCondition(const QueryCondition&) = delete;
     QueryCondition& operator=(const QueryCondition&) = delete;

@@ -197,6 +197,8 @@ TEST_F(EndToEndLive, WrongUsageIsOneSentence) {
               "pallax: RECORDING excludes --for (see pallax status --help)\n");
     EXPECT_EQ(refused({"events", "--for", "3", "a.pcap"}),
               "pallax: --for requires --live (see pallax events --help)\n");
+    EXPECT_EQ(refused({"events", "--live", "--where", "rsrp >"}),
+              "pallax: --where: This is not a whole condition.\n");
     EXPECT_EQ(refused({"sql", "--live", "--for", "0", "select 1"}),
               "pallax: --for: \"0\" is out of range, which is above 0 and up to 1000000000 (see "
               "pallax sql --help)\n");

@@ -236,5 +236,21 @@ TEST(Condition, FieldsThatAnObjectStreamHasNotShownYetAreNull) {
     EXPECT_EQ(sentenceOf("ifx", "turns >"), "This is not a whole condition.");
 }
 
+TEST(ConditionWithoutFields, ShowsItsErrorsButNotItsNames) {
+    const auto error = [](std::string_view text) {
+        return QueryCondition::errorBeforeFields(text, noKnowledge()).value_or("none");
+    };
+    for (const char* text : {"tick > 1", "kind = 'gap' or measured_rsrp < -110", "[a b] is null",
+                             "lte.section.field > 1", "quality('rsrp', a) = 'good'", "1"}) {
+        EXPECT_EQ(error(text), "none") << text;
+    }
+    EXPECT_EQ(error("x >"), "This is not a whole condition.");
+    EXPECT_EQ(error("x > > 1"), "near \">\": syntax error (line 1, column 5 of the condition)");
+    EXPECT_EQ(error("(x"), "This is not a condition: \"(\" is not closed (line 1, column 1 of the "
+                           "condition)");
+    EXPECT_EQ(error("nothing(1)"), "no such function: nothing");
+    EXPECT_EQ(error(""), "There is no condition.");
+}
+
 } // namespace
 } // namespace pallax
