@@ -51,8 +51,21 @@ bool isRecording(const std::string& word) {
     return word == "-" || std::filesystem::exists(word, ignored);
 }
 
+/// Whether the last word is a query: no file of that name is there, and it has a blank or follows
+/// recordings.
+bool isQueryWord(const std::vector<std::string>& words) {
+    return !words.empty() && !isRecording(words.back()) &&
+           (words.size() > 1 || words.back().find(' ') != std::string::npos);
+}
+
 Result<Question, Refusal> questionOf(const SqlOptions& options) {
     Question question{options.words, {}};
+    if (options.file && !options.live && isQueryWord(question.recordings)) {
+        return Refusal{
+            formatText("sql takes a query or --file, not both, and there is no recording \"%@\"",
+                       {question.recordings.back()}),
+            kExitWrongUsage};
+    }
     if (options.file) {
         const auto content = readRegularFile(*options.file, kLongestStatement);
         if (!content) {
@@ -78,9 +91,7 @@ Result<Question, Refusal> questionOf(const SqlOptions& options) {
         }
         return question;
     }
-    const bool isQuery = recordings.size() == 1 && !isRecording(recordings.front()) &&
-                         recordings.front().find(' ') != std::string::npos;
-    if (recordings.empty() || (isQuery && !question.query)) {
+    if (recordings.empty() || (!question.query && isQueryWord(recordings))) {
         return Refusal{"sql takes recordings and then a query (see pallax sql --help)",
                        kExitWrongUsage};
     }

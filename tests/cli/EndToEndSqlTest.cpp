@@ -127,6 +127,23 @@ TEST_F(EndToEndSql, ReadsQueriesFromStandardInput) {
     EXPECT_EQ(wrong.err(), "pallax: no such column: x (line 1, column 8 of the query)\n");
 }
 
+TEST_F(EndToEndSql, AQueryBesideAFileIsWrongUsage) {
+    const std::string query = fileOf("select 1 as a");
+    for (const std::vector<std::string>& words : {std::vector<std::string>{drive}, {}}) {
+        std::vector<std::string> command = {"sql", "--file", query};
+        command.insert(command.end(), words.begin(), words.end());
+        command.emplace_back("select 2");
+        PallaxProcess process(world, command);
+        EXPECT_EQ(process.wait(), 2);
+        EXPECT_EQ(process.out(), "");
+        EXPECT_EQ(process.err(), "pallax: sql takes a query or --file, not both, and there is no "
+                                 "recording \"select 2\"\n");
+    }
+    PallaxProcess process(world, {"sql", "--file", query, "--format", "csv", drive});
+    EXPECT_EQ(process.wait(), 0);
+    EXPECT_EQ(process.out(), "a\n1\n");
+}
+
 TEST_F(EndToEndSql, StopsAQueryAfterItsTime) {
     PallaxProcess process(world, {"sql", "--timeout", "0.2", "--format", "csv", drive, kEndless});
     EXPECT_EQ(process.wait(), 1);
