@@ -55,11 +55,11 @@ public:
         int count = 0;
         const char* const text = el_gets(_edit.get(), &count);
         if (_isCleared) {
-            (void)::write(STDOUT_FILENO, "\n", 1);
+            (void)!::write(STDOUT_FILENO, "\n", 1);
             return Outcome::Cleared;
         }
         if (text == nullptr || count <= 0) {
-            (void)::write(STDOUT_FILENO, "\n", 1);
+            (void)!::write(STDOUT_FILENO, "\n", 1);
             return Outcome::End;
         }
         line.assign(text, static_cast<std::size_t>(count));
