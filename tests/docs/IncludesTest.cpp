@@ -81,7 +81,7 @@ const std::vector<Layer>& layers() {
          {"text", "platform", "LogGenerator/Technologies", "monitor", "host", "telephony",
           "console", "decoding"}},
         {"live",
-         {"text", "platform", "LogGenerator/Technologies", "host", "timeline", "console",
+         {"text", "platform", "LogGenerator/Technologies", "host", "timeline", "query", "console",
           "decoding", "link"}},
         {"querying",
          {"text", "plist", "platform", "packets", "LogGenerator/Technologies", "knowledge", "host",

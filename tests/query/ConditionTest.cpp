@@ -248,7 +248,7 @@ TEST(ConditionWithoutFields, ShowsItsErrorsButNotItsNames) {
     EXPECT_EQ(error("x > > 1"), "near \">\": syntax error (line 1, column 5 of the condition)");
     EXPECT_EQ(error("(x"), "This is not a condition: \"(\" is not closed (line 1, column 1 of the "
                            "condition)");
-    EXPECT_EQ(error("nothing(1)"), "no such function: nothing");
+    EXPECT_EQ(error("nosuch(1)"), "no such function: nosuch (line 1, column 1 of the condition)");
     EXPECT_EQ(error(""), "There is no condition.");
 }
 

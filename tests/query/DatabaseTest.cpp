@@ -230,7 +230,7 @@ TEST_F(DatabaseTest, SmallRowsAreCountedWithTheRoomAroundThem) {
         return true;
     });
     const Lines answer = ask("with recursive c(n) as (select 1 union all select n + 1 from c limit "
-                             "20000000) select 'abcd' from c order by random() limit 20000000");
+                             "20000000) select 'abcd' from c order by random()");
     EXPECT_EQ(answer, Lines{"The query needs more than 256 MiB of memory."});
     EXPECT_LT(most - before, std::size_t{345} << 20U);
 }
