@@ -25,12 +25,6 @@ bool isRunning(std::span<const Field> fields) {
 
 } // namespace
 
-std::optional<ListLayout::Sizes> ListLayout::unexpectedSizes(const LogRecord& record) const {
-    const std::size_t counted = countIn(record);
-    return sizeCheck && !seemsToFit(record, counted) ? std::optional(sizesIn(record, counted))
-                                                     : std::nullopt;
-}
-
 bool ListPart::looksFor(const PropertyList& element) const {
     const DictionaryRef cell = element.dictionary();
     return cell != nullptr && holds(*cell, kHXCellMonitorCellType, cellType) &&

@@ -220,13 +220,15 @@ struct ListLayout {
         return {static_cast<std::uint8_t>(counted * entries.layout.stride),
                 static_cast<std::uint8_t>(record.length() - others * sizeCheck->otherLength)};
     }
-    /// False if the record claims no entries, or more than it seems to have room for.
+    /// False if the list has a size check, and the record claims no entries, or more than it seems
+    /// to have room for.
     bool seemsToFit(const LogRecord& record, std::size_t counted) const {
+        if (!sizeCheck) {
+            return true;
+        }
         const Sizes sizes = sizesIn(record, counted);
         return counted != 0 && sizes.expected <= sizes.actual;
     }
-    /// Both sizes, if the list has a size check and does not seem to fit.
-    std::optional<Sizes> unexpectedSizes(const LogRecord& record) const;
 };
 
 /// The part of a property list that contains the fields of a record.

@@ -142,8 +142,7 @@ private:
     void readEntries(const ListLayout& list, const LogRecord& place, std::size_t count,
                      FieldId first) {
         const EntryList entries = list.entriesIn(place, count);
-        const bool isRefused = list.sizeCheck && !list.seemsToFit(place, count);
-        const std::size_t whole = isRefused ? 0 : entries.wholeCount();
+        const std::size_t whole = list.seemsToFit(place, count) ? entries.wholeCount() : 0;
         _sink.beginList({list.key, &list, whole});
         if (whole > 0) {
             readEach(list, place, entries, whole, first);

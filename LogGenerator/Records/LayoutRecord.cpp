@@ -18,9 +18,11 @@ bool isPlain(const CodeLayout& code) {
 
 void logUnexpectedSizes(const CodeLayout& code, const LogRecord& record) {
     for (const ListLayout& list : code.lists) {
-        if (const auto sizes = list.unexpectedSizes(record)) {
+        const std::size_t counted = list.countIn(record);
+        if (!list.seemsToFit(record, counted)) {
+            const auto [expected, actual] = list.sizesIn(record, counted);
             systemLog(LogPriority::Error, "Unexpected log packet bytes size: expected=%d actual=%d",
-                      sizes->expected, sizes->actual);
+                      expected, actual);
         }
     }
 }

@@ -139,8 +139,11 @@ std::string unexpectedSizes(unsigned count, unsigned others, std::size_t length)
     ByteBuffer bytes(length);
     bytes[0] = static_cast<std::uint8_t>(count);
     bytes[1] = static_cast<std::uint8_t>(others);
-    const auto sizes = kChecked.unexpectedSizes(LogRecord(bytes));
-    return sizes ? std::to_string(sizes->expected) + " " + std::to_string(sizes->actual) : "";
+    const LogRecord record(bytes);
+    const auto sizes = kChecked.sizesIn(record, count);
+    return kChecked.seemsToFit(record, count)
+               ? ""
+               : std::to_string(sizes.expected) + " " + std::to_string(sizes.actual);
 }
 
 TEST(Layout, SizesAreComparedIn8Bits) {
@@ -157,7 +160,7 @@ TEST(Layout, WithoutASizeCheckNoSizeIsUnexpected) {
     const ListLayout list{.entries = {{.start = 2, .stride = 100, .bytesRead = 1}},
                           .count = u8At(0)};
     const ByteBuffer bytes = {0, 0};
-    EXPECT_FALSE(list.unexpectedSizes(LogRecord(bytes)));
+    EXPECT_TRUE(list.seemsToFit(LogRecord(bytes), 0));
 }
 
 TEST(Layout, WhatARecordTellsIsRememberedInPlaceOfWhatWasBefore) {
