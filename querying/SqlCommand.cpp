@@ -13,6 +13,7 @@
 #include "host/Files.h"
 #include "host/Interruption.h"
 #include "host/MonotonicClock.h"
+#include "host/RecordingParts.h"
 #include "host/WallClock.h"
 #include "link/Settings.h"
 #include "live/LiveSession.h"
@@ -185,6 +186,11 @@ ExitStatus askRecordings(const SqlOptions& options, const Settings& settings,
     const BuildBundle bundle;
     DroppedNotices notices;
     const DecoderEnvironment environment{resources, bundle, notices, technologies()};
+    for (const PartPaths& parts : joinedParts(question.recordings, Recording::open)) {
+        if (const auto missing = missingParts(parts)) {
+            complain(*missing);
+        }
+    }
     Waiting waiting;
     const auto recorded =
         RecordedTimeline::open({question.recordings, options.technology, settings.journal,

@@ -144,6 +144,20 @@ TEST_F(EndToEndSql, AQueryBesideAFileIsWrongUsage) {
     EXPECT_EQ(process.out(), "a\n1\n");
 }
 
+TEST_F(EndToEndSql, TellsThatAPartIsMissing) {
+    const std::string first = world.path("drive-0001.pcap");
+    const std::string third = world.path("drive-0003.pcap");
+    std::filesystem::copy(drive, first);
+    std::filesystem::copy(drive, third);
+    PallaxProcess process(
+        world, {"sql", "--format", "csv", first, third, "select count(*) as packets from packet"});
+    EXPECT_EQ(process.wait(), 0);
+    EXPECT_EQ(process.out(), "packets\n2400\n");
+    EXPECT_EQ(process.err(), "pallax: " + first + " and " + third +
+                                 " are read as one, without the part between them: " +
+                                 world.path("drive-0002.pcap") + ".\n");
+}
+
 TEST_F(EndToEndSql, StopsAQueryAfterItsTime) {
     PallaxProcess process(world, {"sql", "--timeout", "0.2", "--format", "csv", drive, kEndless});
     EXPECT_EQ(process.wait(), 1);
