@@ -16,6 +16,7 @@ void ObjectSamples::give(const PropertyList& object, SampleSink& sink) {
     _shown.reserve(before.size());
     _sink = &sink;
     _lists = 0;
+    _latest = 0;
     _path.clear();
     walk(object);
     if (_shown != before) {
@@ -78,14 +79,18 @@ void ObjectSamples::giveList(const Array& elements) {
 }
 
 FieldId ObjectSamples::take() {
-    const auto found = _ids.find(std::string_view(_path));
-    FieldId id = found != _ids.end() ? found->second : kNoField;
-    if (id == kNoField) {
-        if (_fields.size() == kMostPaths) {
+    // Messages mostly repeat the paths of those before them: a tenth of the time goes to the search
+    // for a path if the one that followed is not tried first.
+    FieldId id = _after[_latest];
+    if (id == kNoField || _fields[id].key != _path) {
+        const auto found = _ids.find(std::string_view(_path));
+        if (found == _ids.end() && _fields.size() == kMostPaths) {
             return kNoField;
         }
-        id = add(_path);
+        id = found != _ids.end() ? found->second : add(_path);
+        _after[_latest] = id;
     }
+    _latest = id + 1;
     if (_lists == 0) {
         _shown.push_back(id);
     }
@@ -95,6 +100,7 @@ FieldId ObjectSamples::take() {
 FieldId ObjectSamples::add(std::string_view path) {
     const auto id = static_cast<FieldId>(_fields.size());
     _fields.emplace_back().key = _ids.emplace(path, id).first->first;
+    _after.push_back(kNoField);
     return id;
 }
 
@@ -110,6 +116,7 @@ KeyFrame::Paths ObjectSamples::paths() const {
 void ObjectSamples::resume(const KeyFrame::Paths& paths) {
     _ids.clear();
     _fields.clear();
+    _after.assign(1, kNoField);
     for (const std::string& path : paths.known) {
         (void)add(path);
     }

@@ -50,13 +50,16 @@ private:
     void removeOthers(const std::vector<FieldId>& before);
 
     std::unordered_map<std::string, FieldId, Hash, std::equal_to<>> _ids;
-    std::deque<Field> _fields;   ///< by number; `_ids` owns the keys
+    std::deque<Field> _fields; ///< by number; `_ids` owns the keys
+    /// By the number of a path plus 1, the path that followed it last; at 0, the first path.
+    std::vector<FieldId> _after = {kNoField};
     std::vector<FieldId> _shown; ///< outside lists, in the latest object
 
     // While an object is walked:
     SampleSink* _sink = nullptr;
     std::string _path;
-    std::size_t _lists = 0; ///< open lists
+    std::size_t _lists = 0;  ///< open lists
+    std::size_t _latest = 0; ///< place in `_after`
 };
 
 } // namespace pallax
