@@ -33,10 +33,14 @@ RecordingError errorOf(Kind kind, const std::string& name, std::string_view what
 /// pcapng as 64 bits in its own units.
 enum class StampForm { Pcap, PcapNg };
 
+/// Reading 4 KiB at a time, as files do by themselves, takes a tenth of the time of a decode.
+using FileBuffer = std::array<char, 64 * 1024>;
+
 /// A file that is open for reading, and its content.
 struct OpenedFile {
     std::FILE* content = nullptr; ///< owned by the capture once it reads it
     bool isStream = false;
+    std::unique_ptr<FileBuffer> buffer = nullptr; ///< of `content`; null if it has its own
     std::unique_ptr<DecompressedFile> compressed = nullptr; ///< null if the file is plain
 
     DecompressedFile::Ending ending() const {
@@ -196,7 +200,7 @@ Result<OpenedInput, RecordingError> openFile(const Recording::Input& input,
 
 /// The content of a file whose first byte has been read; null, with errno, if it cannot be read.
 OpenedFile contentOf(OpenedInput input, std::uint8_t first) {
-    OpenedFile file{nullptr, input.isStream};
+    OpenedFile file{.isStream = input.isStream};
     if (mayBeCompressed(first)) {
         file.compressed = std::make_unique<DecompressedFile>(std::move(input.descriptor), first);
         file.content = file.compressed->openContent();
@@ -205,6 +209,8 @@ OpenedFile contentOf(OpenedInput input, std::uint8_t first) {
     const int number = ::fcntl(input.descriptor.number(), F_DUPFD_CLOEXEC, 0);
     file.content = number >= 0 ? ::fdopen(number, "rb") : nullptr;
     if (file.content != nullptr) {
+        file.buffer = std::make_unique<FileBuffer>();
+        (void)std::setvbuf(file.content, file.buffer->data(), _IOFBF, file.buffer->size());
         (void)std::ungetc(first, file.content);
     } else if (number >= 0) {
         (void)::close(number);
