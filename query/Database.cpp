@@ -172,8 +172,9 @@ void Database::Close::operator()(sqlite3* connection) const {
 Database::Database() : _authority(std::make_unique<Authority>()), _schemas{"main"} {
     limitQueryMemory();
     sqlite3* connection = nullptr;
-    const int result = sqlite3_open_v2(":memory:", &connection,
-                                       SQLITE_OPEN_READWRITE | SQLITE_OPEN_MEMORY, nullptr);
+    const int result =
+        sqlite3_open_v2(":memory:", &connection,
+                        SQLITE_OPEN_READWRITE | SQLITE_OPEN_MEMORY | SQLITE_OPEN_NOMUTEX, nullptr);
     _connection.reset(connection);
     if (result != SQLITE_OK) {
         throw std::runtime_error("no memory for queries");

@@ -2,6 +2,7 @@
 
 #include "monitor/TickGrid.h"
 #include "query/StateColumns.h"
+#include "query/TickWalk.h"
 #include "query/TimelineTables.h"
 #include "timeline/Timeline.h"
 
@@ -12,102 +13,96 @@ namespace pallax {
 
 namespace {
 
-/// The ticks and the values at them, decoded from a key frame on.
 class StateRows final : public Rows {
 public:
-    /// `near` is a key frame close to the rows that were asked for last, and becomes one close to
-    /// these: a join asks for the rows at one time after the other.
-    StateRows(Timeline& timeline, const PacketRange& range, const StateColumns& columns,
-              std::optional<TimelineKeyFrame>& near)
-        : _timeline(timeline), _range(range), _columns(columns), _near(near),
-          _values(timeline.fieldTable(), timeline.entryTable()) {
+    /// `walk` is where the rows that were asked for last have ended, and becomes where these end: a
+    /// join asks for the rows at one time after the other.
+    StateRows(Timeline& timeline, const RowBounds& bounds, const PacketRange& range,
+              const StateColumns& columns, std::unique_ptr<TickWalk>& walk)
+        : _bounds(bounds), _range(range), _columns(columns), _home(walk),
+          _keeps(range.last - range.first < kMostPacketsToKeep) {
         if (range.first > range.last) {
             return;
         }
-        const TimelineKeyFrame& kept = *timeline.keyFrames().atOrBefore(range.first - 1);
-        const bool isNearer = near && near->packet < range.first && near->packet > kept.packet;
-        const TimelineKeyFrame& from = isNearer ? *near : kept;
-        _values.take(from.values);
-        _grid = from.grid;
-        _shown = from.ticks.empty() ? 0 : from.ticks.back().packet;
-        _noteFrom = std::max(range.first, from.packet + kNoteEvery);
-        _replay = timeline.replayFrom(from);
-        _reader = timeline.journal().reader(from.packet + 1);
+        _walk = std::move(_home);
+        const TimelineKeyFrame& from = *timeline.keyFrames().atOrBefore(range.first - 1);
+        if (!_walk || !_walk->reaches(range.first, bounds.leastTime) ||
+            _walk->packet() < from.packet) {
+            _walk = std::make_unique<TickWalk>(timeline, from);
+        }
+        _kept = _walk->kept().size();
+        for (const Stretch& stretch : timeline.stretches()) {
+            _lastStretch = stretch.firstPacket <= range.last ? stretch.firstPacket : _lastStretch;
+        }
     }
+    ~StateRows() override {
+        if (_walk && !_walk->hasEnded()) {
+            _home = std::move(_walk);
+        }
+    }
+    StateRows(const StateRows&) = delete;
+    StateRows& operator=(const StateRows&) = delete;
 
     bool next() override {
-        while (_replay) {
-            if (_held) {
-                _replay->update(*std::exchange(_held, std::nullopt), &_values);
-            }
-            _held = _reader->next();
-            if (!_held || _held->number > _timeline.packets()) {
-                _held.reset();
-                return end();
-            }
-            _range.noteRead(_held->number);
-            if (_held->number == _noteFrom) {
-                note();
-            }
-            const auto passed = _grid.passedBefore(_held->time);
-            if (passed && show(*passed)) {
+        if (!_walk) {
+            return false;
+        }
+        while (_place < _kept) {
+            if (shows(_walk->kept()[_place++])) {
                 return true;
             }
-            if (_shown >= _range.last) {
-                _replay.reset();
+        }
+        while (_hasSeenCurrent ? goesOn() : true) {
+            _hasSeenCurrent = true;
+            const TickWalk::State* const current = _walk->current();
+            _isShowingCurrent = current != nullptr && shows(*current);
+            if (_isShowingCurrent) {
+                return true;
             }
         }
         return false;
     }
 
     std::int64_t number(std::int64_t /*place*/) const override {
-        return static_cast<std::int64_t>(_shown);
+        return static_cast<std::int64_t>(_shown->packet);
     }
     void give(std::size_t column, ColumnValue& value) const override {
-        _columns.give(column, {_tick.time, _shown, _tick.number}, _values, value);
+        const StateMoment moment{_shown->tick.time, _shown->packet, _shown->tick.number};
+        _columns.give(column, moment, _shown->values, value);
     }
 
 private:
-    /// A key frame takes as long as reading so many packets.
-    static constexpr std::uint64_t kNoteEvery = 128;
+    /// Of a longer range, no tick is kept, because keeping takes as long as reading some packets.
+    static constexpr std::uint64_t kMostPacketsToKeep = 10'000;
 
-    void note() {
-        std::vector<ShownTick> ticks;
-        if (_shown != 0) {
-            ticks.push_back({_tick, _shown});
-        }
-        _near = TimelineKeyFrame{
-            _replay->packet(), _replay->keyFrame(), _values, _grid, std::move(ticks), {}};
+    bool goesOn() { return !isPast() && _walk->next(_range, _isShowingCurrent && _keeps); }
+    /// Whether no further tick can be one of the rows. Time may step back between stretches.
+    bool isPast() const {
+        const TickWalk::State* const current = _walk->current();
+        return current != nullptr && (current->packet >= _range.last ||
+                                      (current->packet >= _lastStretch &&
+                                       microseconds(current->tick.time) > _bounds.mostTime));
     }
-    /// The tick after the last packet, if it has new data.
-    bool end() {
-        const bool isShown = _replay->packet() > 0 && show(_grid.next());
-        _replay.reset();
-        return isShown;
-    }
-    /// Whether the tick has new data and belongs to the rows.
-    bool show(const TickGrid::Tick& tick) {
-        const std::uint64_t packet = _replay->packet();
-        if (packet <= _shown) {
-            return false;
-        }
-        _tick = tick;
-        _shown = packet;
-        return packet >= _range.first && packet <= _range.last;
+    bool shows(const TickWalk::State& state) {
+        const std::int64_t time = microseconds(state.tick.time);
+        const bool isRow = state.packet >= _range.first && state.packet <= _range.last &&
+                           time >= _bounds.leastTime && time <= _bounds.mostTime;
+        _shown = isRow ? &state : _shown;
+        return isRow;
     }
 
-    Timeline& _timeline;
+    RowBounds _bounds;
     PacketRange _range;
     const StateColumns& _columns;
-    std::optional<TimelineKeyFrame>& _near;
-    std::uint64_t _noteFrom = 0;     ///< the packet before which it is taken
-    std::unique_ptr<Replay> _replay; ///< null after the last row
-    std::unique_ptr<PacketReader> _reader;
-    std::optional<JournalPacket> _held; ///< comes after the current tick
-    CurrentValues _values;
-    TickGrid _grid;
-    TickGrid::Tick _tick{0, {}};
-    std::uint64_t _shown = 0; ///< the last packet before the current tick
+    std::unique_ptr<TickWalk>& _home;
+    bool _keeps;
+    std::unique_ptr<TickWalk> _walk; ///< null: there are no rows
+    std::size_t _kept = 0;           ///< how many were there at first
+    std::size_t _place = 0;          ///< among these
+    std::uint64_t _lastStretch = 0;  ///< first packet of the range's last stretch of time
+    bool _hasSeenCurrent = false;
+    bool _isShowingCurrent = false;
+    const TickWalk::State* _shown = nullptr;
 };
 
 class StateTable final : public QueryTable {
@@ -120,7 +115,7 @@ public:
         return static_cast<double>(_timeline.packets()) / kPacketsPerTick;
     }
     std::unique_ptr<Rows> rows(const RowBounds& bounds) override {
-        return std::make_unique<StateRows>(_timeline, ticksIn(bounds), _columns, _near);
+        return std::make_unique<StateRows>(_timeline, bounds, ticksIn(bounds), _columns, _walk);
     }
 
 private:
@@ -136,7 +131,7 @@ private:
 
     Timeline& _timeline;
     StateColumns _columns;
-    std::optional<TimelineKeyFrame> _near;
+    std::unique_ptr<TickWalk> _walk; ///< where the rows that were asked for last have ended
 };
 
 } // namespace

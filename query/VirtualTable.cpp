@@ -245,6 +245,7 @@ int filter(sqlite3_vtab_cursor* opened, int /*number*/, const char* plan, int co
         bound(bounds, step[0], step[1], values[index]);
     }
     try {
+        cursor.rows.reset(); // the new rows may begin where these have ended
         cursor.rows = open.table->rows(bounds);
     } catch (const std::exception& error) {
         return fail(*opened->pVtab, error);

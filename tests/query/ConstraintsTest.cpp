@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <cstdio>
+#include <span>
 
 namespace pallax {
 namespace {
@@ -14,8 +15,7 @@ class ConstraintsTest : public testing::TestWithParam<const char*> {
 protected:
     ConstraintsTest() : _fixture(GetParam()) {
         _fixture.drive(5, std::chrono::seconds(8));
-        // One key frame, so that the state goes on from where it was asked for last.
-        _timeline = _fixture.indexed(TimelineFixture::closeKeyFrames(100'000));
+        _timeline = _fixture.indexed();
         addTimelineTables(_database, *_timeline);
         for (const Database::Table& table : _database.tables()) {
             if (table.name != "series") { // its arguments are no conditions
@@ -112,14 +112,54 @@ TEST_P(ConstraintsTest, GiveTheRowsThatTheConditionsSay) {
     EXPECT_GT(_rows, 100U);
 }
 
-TEST_P(ConstraintsTest, TheStateGoesOnFromWhereItWasAskedForLast) {
-    EXPECT_TRUE(doubles::holds([&] {
-        const std::string first = std::to_string(any::between(1, 320));
-        const auto state = std::find_if(_tables.begin(), _tables.end(),
-                                        [](const auto& each) { return each.name == "state"; });
-        compare(*state, "packet between " + first + " and " + first + " + " +
-                            std::to_string(any::between(0, 60)));
-    }));
+class StateWalkTest : public testing::TestWithParam<const char*> {};
+
+INSTANTIATE_TEST_SUITE_P(All, StateWalkTest, testing::ValuesIn(technologyNames()));
+
+TEST_P(StateWalkTest, GoesOnFromWhereItWasAskedForLast) {
+    TimelineFixture fixture(GetParam());
+    fixture.drive(5, std::chrono::minutes(6));
+    // One key frame, so that no nearer one is taken.
+    const auto timeline = fixture.indexed(TimelineFixture::closeKeyFrames(100'000));
+    Database database;
+    addTimelineTables(database, *timeline);
+    const auto numbersOf = [&](const char* column) {
+        std::vector<std::int64_t> numbers;
+        for (const std::string& line :
+             linesOf(database, std::string("select ") + column + " from state")) {
+            numbers.push_back(std::stoll(line));
+        }
+        return numbers;
+    };
+    const auto all = linesOf(database, "select * from state");
+    ASSERT_GT(all.size(), 100U);
+    for (const char* column : {"packet", "time"}) {
+        const auto numbers = numbersOf(column);
+        ASSERT_EQ(numbers.size(), all.size());
+        const auto isRightBetween = [&](std::int64_t first, std::int64_t last) {
+            std::vector<std::string> expected;
+            for (std::size_t place = 0; place < all.size(); ++place) {
+                if (numbers[place] >= first && numbers[place] <= last) {
+                    expected.push_back(all[place]);
+                }
+            }
+            return linesOf(database,
+                           formatText("select * from state where %@ between %lld and %lld",
+                                      {column, first, last})) == expected;
+        };
+        for (const std::int64_t number : std::span(numbers).first(100)) {
+            EXPECT_TRUE(isRightBetween(number, number)) << number;
+        }
+        EXPECT_TRUE(isRightBetween(numbers[0], numbers[9])) << "more have come than are kept";
+        const std::int64_t tick = (numbers.back() - numbers.front()) / std::ssize(numbers);
+        std::int64_t first = numbers.front();
+        EXPECT_TRUE(doubles::holds([&] {
+            // Mostly a little later, as a join asks.
+            const bool isFar = any::between(0, 9) == 0 || first > numbers.back();
+            first = isFar ? any::elementOf(numbers) : first + any::between(-1, 8) * tick / 4;
+            RC_ASSERT(isRightBetween(first, first + any::between(0, 24) * tick / 4));
+        }));
+    }
 }
 
 } // namespace
