@@ -24,7 +24,7 @@
 namespace pallax {
 
 ExitStatus StatusCommand::run(Output& output) {
-    return show(ViewedFile::open(_options.recording, _options.technology, _environment.decoder,
+    return show(ViewedFile::open(*_options.recording, _options.technology, _environment.decoder,
                                  _environment.journal),
                 output);
 }
@@ -122,8 +122,7 @@ ExitStatus runStatus(const StatusOptions& options) {
         settings->journal};
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     StatusCommand command(options, environment);
-    return options.recording.empty() ? showLive(options, *settings, command, output)
-                                     : command.run(output);
+    return !options.recording ? showLive(options, *settings, command, output) : command.run(output);
 }
 
 } // namespace pallax

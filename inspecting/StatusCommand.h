@@ -25,7 +25,7 @@ struct RecordedTechnology;
 
 /// `pallax status`: the radio in a few lines.
 struct StatusOptions {
-    std::string recording; ///< or a saved snapshot; empty: the live modem
+    std::optional<std::string> recording; ///< or a saved snapshot; nothing: the live modem
     /// How long the live modem is received.
     std::chrono::nanoseconds duration = std::chrono::seconds(5);
     /// The technology of the recording, overriding its link type.

@@ -34,10 +34,13 @@ ExitStatus QueryRun::run(const std::string& text, RowFormat format) {
 
 ExitStatus QueryRun::write(Query& query, RowFormat format) {
     RowWriter writer(format, query.columns(), _seams.output);
+    bool hasRows = false;
     while (true) {
         auto row = query.next();
         if (!row) {
-            writer.finish();
+            if (hasRows) {
+                writer.finish();
+            }
             _seams.tell(_stopped.empty() ? row.error().sentence : _stopped);
             return kExitFailure;
         }
@@ -47,6 +50,7 @@ ExitStatus QueryRun::write(Query& query, RowFormat format) {
             return kExitSuccess;
         }
         writer.write(*std::move(values));
+        hasRows = true;
     }
 }
 

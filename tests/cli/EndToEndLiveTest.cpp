@@ -204,6 +204,12 @@ TEST_F(EndToEndLive, WrongUsageIsOneSentence) {
               "pallax sql --help)\n");
 }
 
+TEST_F(EndToEndLive, AnEmptyNameIsNotTheLiveModem) {
+    const Run run = this->run({"status", ""});
+    EXPECT_EQ(run.status, 3);
+    EXPECT_EQ(run.err, "pallax:  cannot be opened: No such file or directory.\n");
+}
+
 TEST_F(EndToEndLive, WrongSettingsAreOneSentence) {
     std::filesystem::create_directories(world.path("config/pallax"));
     std::ofstream(world.path("config/pallax/pallax.conf")) << "journal-hours = 0\n";

@@ -144,6 +144,16 @@ TEST_F(EndToEndSql, AQueryBesideAFileIsWrongUsage) {
     EXPECT_EQ(process.out(), "a\n1\n");
 }
 
+TEST_F(EndToEndSql, AQueryThatFailsBeforeItsFirstRowWritesNoHead) {
+    for (const char* format : {"table", "csv", "json"}) {
+        PallaxProcess process(
+            world, {"sql", "--format", format, drive, "select * from series('nosuch', 5)"});
+        EXPECT_EQ(process.wait(), 1);
+        EXPECT_EQ(process.out(), "") << format;
+        EXPECT_EQ(process.err(), "pallax: \"nosuch\" is not a field\n");
+    }
+}
+
 TEST_F(EndToEndSql, TellsThatAPartIsMissing) {
     const std::string first = world.path("drive-0001.pcap");
     const std::string third = world.path("drive-0003.pcap");
