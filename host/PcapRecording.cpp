@@ -34,7 +34,7 @@ RecordingError errorOf(Kind kind, const std::string& name, std::string_view what
 enum class StampForm { Pcap, PcapNg };
 
 /// Reading 4 KiB at a time, as files do by themselves, takes a tenth of the time of a decode.
-using FileBuffer = std::array<char, 64 * 1024>;
+using FileBuffer = std::array<char, 65'536>;
 
 /// A file that is open for reading, and its content.
 struct OpenedFile {

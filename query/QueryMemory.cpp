@@ -17,6 +17,7 @@ int roundUp(int size) {
 }
 
 void countWholeBlocks() {
+    // NOLINTBEGIN(cppcoreguidelines-no-malloc): malloc_usable_size() is for these.
     sqlite3_mem_methods methods{};
     methods.xMalloc = [](int size) { return std::malloc(static_cast<std::size_t>(size)); };
     methods.xFree = std::free;
@@ -24,6 +25,7 @@ void countWholeBlocks() {
         return std::realloc(block, static_cast<std::size_t>(size));
     };
     methods.xSize = [](void* block) { return static_cast<int>(::malloc_usable_size(block)); };
+    // NOLINTEND(cppcoreguidelines-no-malloc)
     methods.xRoundup = roundUp;
     methods.xInit = [](void*) { return SQLITE_OK; };
     methods.xShutdown = [](void*) {};
