@@ -52,11 +52,11 @@ public:
                 return true;
             }
         }
-        while (_hasSeenCurrent ? goesOn() : true) {
-            _hasSeenCurrent = true;
-            const TickWalk::State* const current = _walk->current();
-            _isShowingCurrent = current != nullptr && shows(*current);
-            if (_isShowingCurrent) {
+        if (!std::exchange(_hasSeenCurrent, true) && showsCurrent()) {
+            return true;
+        }
+        while (goesOn()) {
+            if (showsCurrent()) {
                 return true;
             }
         }
@@ -75,6 +75,11 @@ private:
     /// Of a longer range, no tick is kept, because keeping takes as long as reading some packets.
     static constexpr std::uint64_t kMostPacketsToKeep = 10'000;
 
+    bool showsCurrent() {
+        const TickWalk::State* const current = _walk->current();
+        _isShowingCurrent = current != nullptr && shows(*current);
+        return _isShowingCurrent;
+    }
     bool goesOn() { return !isPast() && _walk->next(_range, _isShowingCurrent && _keeps); }
     /// Whether no further tick can be one of the rows. Time may step back between stretches.
     bool isPast() const {
