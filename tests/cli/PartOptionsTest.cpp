@@ -133,7 +133,7 @@ TEST(Options, TheLiveModemStandsForRecordings) {
     EXPECT_TRUE(sql.live);
     EXPECT_EQ(sql.duration, 60s);
     EXPECT_EQ(sql.words, std::vector<std::string>{"select 1"});
-    EXPECT_EQ(parsed<StatusOptions>({"status"}).recording, "");
+    EXPECT_EQ(parsed<StatusOptions>({"status"}).recording, std::nullopt);
     EXPECT_EQ(parsed<StatusOptions>({"status"}).duration, 5s);
     EXPECT_EQ(parsed<StatusOptions>({"status", "--for", "2"}).duration, 2s);
     for (const char* command : {"events", "sql"}) {
