@@ -51,7 +51,7 @@ std::optional<std::string> DecodeWindow::open(const TimeSpan& span, const ZoneRu
 
 bool DecodeWindow::isOverBefore(Time packet) {
     if (_texts.to && _texts.to->isEnd()) {
-        _hasBegun = true; // all packets; the last need not have the latest stamp
+        _hasBegun = true; // every packet counts: the last one may have an earlier stamp than others
         return false;
     }
     if (_lastStretch) {
