@@ -1,10 +1,13 @@
 #include "querying/EditedLines.h"
 
 #include "host/Complaint.h"
+#include "querying/Interrupt.h"
 #include "text/Format.h"
 
+#include <cerrno>
 #include <clocale>
 #include <csignal>
+#include <cwchar>
 #include <histedit.h>
 #include <unistd.h>
 #include <utility>
@@ -14,6 +17,10 @@ namespace pallax {
 namespace {
 
 constexpr std::size_t kMostShown = 200; ///< words of a completion
+constexpr wchar_t kInterruptKey = L'\x03';
+// What mbrtowc() returns besides lengths.
+constexpr auto kWrongBytes = static_cast<std::size_t>(-1);
+constexpr auto kTooFewBytes = static_cast<std::size_t>(-2);
 
 class EditedLines final : public LineReader {
 public:
@@ -28,6 +35,7 @@ public:
         el_set(edit, EL_PROMPT, &prompt);
         el_set(edit, EL_EDITOR, "emacs");
         el_set(edit, EL_SIGNAL, 1);
+        el_set(edit, EL_GETCFN, &key);
         el_set(edit, EL_HIST, &::history, _events.get());
         el_set(edit, EL_ADDFN, "pallax-complete", "Complete a name", &complete);
         el_set(edit, EL_BIND, "\t", "pallax-complete", nullptr);
@@ -50,6 +58,7 @@ public:
     bool isReady() const { return _edit && _events; }
 
     Outcome read(const std::string& before, std::string& line) override {
+        const Interrupt sinceNow(Interrupt::Watched::Yes);
         _before = before;
         _isCleared = false;
         int count = 0;
@@ -96,6 +105,31 @@ private:
     static const char* prompt(EditLine* edit) {
         return of(edit)._before.empty() ? kPrompt : kPromptOfMore;
     }
+    /// The next key of the terminal: 1, or 0 at its end. A Ctrl-C that came before the terminal
+    /// took keys one by one was a signal; here it becomes the key that it was.
+    static int key(EditLine* edit, wchar_t* key) {
+        std::mbstate_t state{};
+        for (;;) {
+            if (of(edit)._always.hasCome()) {
+                *key = kInterruptKey;
+                return 1;
+            }
+            char byte = 0;
+            const ssize_t count = ::read(STDIN_FILENO, &byte, 1);
+            if (count < 0 && errno == EINTR) {
+                continue;
+            }
+            if (count <= 0) {
+                return static_cast<int>(count);
+            }
+            const std::size_t length = std::mbrtowc(key, &byte, 1, &state);
+            if (length == kWrongBytes) {
+                state = {};
+            } else if (length != kTooFewBytes) {
+                return 1;
+            }
+        }
+    }
     static unsigned char clear(EditLine* edit, int /*key*/) {
         of(edit)._isCleared = true;
         return CC_NEWLINE;
@@ -141,6 +175,8 @@ private:
     std::unique_ptr<EditLine, End> _edit;
     std::unique_ptr<History, End> _events;
     std::string _before;
+    /// Between two lines, when the terminal still sends signals, Ctrl-C must not end the program.
+    const Interrupt _always{Interrupt::Watched::Yes};
     bool _isCleared = false;
     bool _hasComplained = false;
 };

@@ -5,7 +5,7 @@
 namespace pallax {
 
 /// Takes Ctrl-C (SIGINT) for as long as it lives, so that it ends what runs and not the program.
-/// One at a time.
+/// They nest: each begins without one, and the innermost takes it.
 class Interrupt {
 public:
     enum class Watched { No, Yes };

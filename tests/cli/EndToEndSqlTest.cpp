@@ -82,6 +82,7 @@ TEST_F(EndToEndSql, CtrlCStopsAQueryOrClearsTheLine) {
     ASSERT_TRUE(terminal.shows("pallax>"));
     terminal.type("select 1,\r");
     ASSERT_TRUE(terminal.shows("   ...>"));
+    (void)terminal.settled();
     terminal.type(kInterrupt);
     terminal.type(std::string(kEndless) + ";\r");
     ASSERT_TRUE(terminal.shows("querying"));
@@ -89,6 +90,22 @@ TEST_F(EndToEndSql, CtrlCStopsAQueryOrClearsTheLine) {
     ASSERT_TRUE(terminal.shows("pallax: The query was stopped.\n"));
     terminal.type("select 6 * 7 as answer;\r");
     EXPECT_TRUE(terminal.shows("    42\n"));
+    terminal.type(".quit\r");
+    EXPECT_EQ(terminal.wait(), 0);
+    EXPECT_TRUE(terminal.isRestored());
+}
+
+// Until the prompt stands, Ctrl-C arrives as a signal and not as a key.
+TEST_F(EndToEndSql, AnInterruptAtThePromptClearsTheLineToo) {
+    PallaxTerminal terminal(world, {"sql", drive}, {});
+    ASSERT_TRUE(terminal.shows("pallax>"));
+    terminal.type("select 1,\r");
+    ASSERT_TRUE(terminal.shows("   ...>"));
+    (void)terminal.settled();
+    terminal.signal(SIGINT);
+    ASSERT_TRUE(terminal.shows("   ...>\npallax>"));
+    terminal.type("select 'ä' || (6 * 7) as answer;\r");
+    EXPECT_TRUE(terminal.shows("ä42\n"));
     terminal.type(".quit\r");
     EXPECT_EQ(terminal.wait(), 0);
     EXPECT_TRUE(terminal.isRestored());
