@@ -94,13 +94,14 @@ void CurrentValues::sampleInEntry(Open& open, const Sample& sample) {
     if (!open.isInEntry) {
         return;
     }
-    std::vector<std::pair<FieldIndex, FieldValue>>& values = slotOf(open).held.values;
+    std::vector<std::pair<FieldIndex, FieldValue>>& values = open.slot->held.values;
     for (const FieldIndex field : _fields->of(sample)) {
-        if (open.held == values.size()) {
-            values.emplace_back(field, FieldValue());
+        auto next = values.begin() + static_cast<std::ptrdiff_t>(open.held++);
+        if (next == values.end()) {
+            next = values.emplace(next, field, FieldValue());
             open.isAnother = true;
         }
-        auto& [heldField, value] = values[open.held++];
+        auto& [heldField, value] = *next;
         if (heldField != field || (_fields->identifies(field) && !shows(value, sample.value))) {
             open.isAnother = true;
         }
@@ -172,7 +173,7 @@ void CurrentValues::beginList(const SampleList& list) {
             identify(around);
         }
         open.list = placeOf(list, around.list);
-        open.outer = around.isInEntry ? slotOf(around).held.entry : around.outer;
+        open.outer = around.isInEntry ? around.slot->held.entry : around.outer;
     }
     _open.push_back(open);
 }
@@ -192,14 +193,15 @@ void CurrentValues::beginEntry(std::size_t index, std::int64_t name) {
     open.held = 0;
     open.isInEntry = true;
     open.isIdentified = false;
-    const Slot& slot = list.slots[list.count];
+    open.slot = &list.slots[list.count];
+    const Slot& slot = *open.slot;
     open.isAnother = slot.known == kNoEntry || slot.outer != open.outer || slot.index != index ||
                      slot.name != name;
 }
 
 void CurrentValues::endEntry() {
     Open& open = _open.back();
-    Slot& slot = slotOf(open);
+    Slot& slot = *open.slot;
     if (slot.held.values.size() > open.held) {
         slot.held.values.resize(open.held);
         open.isAnother = true;
@@ -214,14 +216,12 @@ void CurrentValues::endEntry() {
     }
     ++_lists[open.list].count;
     if (_listener != nullptr) {
-        for (const auto& [field, value] : slot.held.values) {
-            _listener->valueRead(field, slot.held.entry, value);
-        }
+        _listener->entryRead(slot.held);
     }
 }
 
 void CurrentValues::identify(Open& open) {
-    Slot& slot = slotOf(open);
+    Slot& slot = *open.slot;
     if (open.isAnother) {
         slot.known = identified(open, slot);
         slot.outer = open.outer;

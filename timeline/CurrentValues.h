@@ -42,6 +42,12 @@ public:
     public:
         virtual ~Listener() = default;
         virtual void valueRead(FieldIndex field, EntryId entry, const FieldValue& value) = 0;
+        /// Gets the values of an entry at once.
+        virtual void entryRead(const EntryValues& entry) {
+            for (const auto& [field, value] : entry.values) {
+                valueRead(field, entry.entry, value);
+            }
+        }
         virtual void valueRemoved(FieldIndex field) = 0;
         /// The list begins anew or is gone.
         virtual void listReplaced(ListId list) = 0;
@@ -106,6 +112,7 @@ private:
     /// A list that has begun but not ended.
     struct Open {
         std::size_t list = 0;
+        Slot* slot = nullptr; ///< of the entry, while it is open: looked for only once
         EntryId outer = kNoEntry;
         std::size_t index = 0; ///< of the entry, as the sink gets it
         std::int64_t name = 0;
@@ -133,10 +140,6 @@ private:
     EntryId identified(const Open& open, const Slot& slot);
     std::string identityOf(const Open& open, const Slot& slot) const;
     std::optional<EntryTable::Numbers> numbersOf(const Open& open, const Slot& slot) const;
-    Slot& slotOf(const Open& open) {
-        List& list = _lists[open.list];
-        return list.slots[list.count];
-    }
 
     FieldTable* _fields;
     EntryTable* _entries;

@@ -23,6 +23,12 @@ private:
         _timeline._series.add(field, entry, value);
         _finder.valueRead(field, value);
     }
+    void entryRead(const EntryValues& entry) override {
+        _timeline._series.add(entry);
+        for (const auto& [field, value] : entry.values) {
+            _finder.valueRead(field, value);
+        }
+    }
     void valueRemoved(FieldIndex field) override { _finder.valueRemoved(field); }
     void listReplaced(ListId list) override { _finder.listReplaced(list); }
 

@@ -82,18 +82,37 @@ void SeriesStore::beginPacket(std::uint64_t number, Time time) {
 }
 
 void SeriesStore::add(FieldIndex field, EntryId entry, const FieldValue& value) {
-    Series* series = seriesOf(field, entry);
-    if (series == nullptr) {
-        return;
+    if (Series* const series = seriesOf(field, entry)) {
+        add(*series, value);
     }
-    const Text* text = std::isnan(value.number) ? value.shown.text() : nullptr;
-    if (text != nullptr && !series->runs.empty()) {
-        const SeriesValue latest = series->runs.back().last;
+}
+
+void SeriesStore::add(const EntryValues& entry) {
+    std::size_t place = 0;
+    for (const auto& [field, value] : entry.values) {
+        // The fields of an entry nearly always come in the order of the time before.
+        if (entry.entry < _ofEntries.size() && place < _ofEntries[entry.entry].size() &&
+            _ofEntries[entry.entry][place].field == field) {
+            add(_ofEntries[entry.entry][place], value);
+        } else {
+            add(field, entry.entry, value);
+        }
+        ++place;
+    }
+}
+
+void SeriesStore::add(Series& series, const FieldValue& value) {
+    if (!std::isnan(value.number)) {
+        return add(series, SeriesValue::ofNumber(value.number));
+    }
+    const Text* text = value.shown.text();
+    if (text != nullptr && !series.runs.empty()) {
+        const SeriesValue latest = series.runs.back().last;
         if (latest.text() != 0 && _texts.text(latest.text()) == text->view()) {
-            return add(*series, latest); // most texts repeat: no lookup
+            return add(series, latest); // most texts repeat: no lookup
         }
     }
-    add(*series, valueOf(value));
+    add(series, valueOf(value));
 }
 
 const SeriesStore::Series* SeriesStore::find(FieldIndex field, EntryId entry) const {

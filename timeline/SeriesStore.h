@@ -97,6 +97,8 @@ public:
     /// The packet whose values follow. Numbers must increase.
     void beginPacket(std::uint64_t number, Time time);
     void add(FieldIndex field, EntryId entry, const FieldValue& value);
+    /// The same for each value of an entry.
+    void add(const EntryValues& entry);
 
     /// The first packet of the cell that contains a packet.
     std::uint64_t cellStart(std::uint64_t packet) const {
@@ -143,6 +145,7 @@ private:
     /// Null if there is no room for another series.
     Series* seriesOf(FieldIndex field, EntryId entry);
     const Series* find(FieldIndex field, EntryId entry) const;
+    void add(Series& series, const FieldValue& value);
     void add(Series& series, const SeriesValue& value);
     static void appendMerged(std::vector<Run>& runs, Run run);
     void halveCells();
