@@ -55,6 +55,7 @@ INSTANTIATE_TEST_SUITE_P(All, ConditionOfTechnologyTest, testing::ValuesIn(techn
 TEST_P(ConditionOfTechnologyTest, HoldsAtTheTicksThatAQueryFinds) {
     QueryFixture fixture(GetParam(), 5, std::chrono::seconds(60));
     auto columns = fixture.database.prepare("select * from state").value().columns();
+    const Lines ticks = fixture.ask("select packet, time, tick from state");
     std::size_t found = 0;
     for (std::size_t place = 3; place < columns.size(); place += 7) {
         const std::string name = "\"" + columns[place] + "\"";
@@ -66,7 +67,7 @@ TEST_P(ConditionOfTechnologyTest, HoldsAtTheTicksThatAQueryFinds) {
                 QueryCondition::compile(text, reading.fields, About::State, noKnowledge());
             ASSERT_TRUE(condition) << condition.error();
             Lines held;
-            for (const std::string& line : fixture.ask("select packet, time, tick from state")) {
+            for (const std::string& line : ticks) {
                 StateMoment tick;
                 tick.packet = std::stoull(line);
                 tick.time =
