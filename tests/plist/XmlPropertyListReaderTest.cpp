@@ -10,12 +10,12 @@ namespace {
 
 using doubles::sameInOrder;
 
-PropertyListResult parse(std::string_view xml) {
+PropertyListResult parseXml(std::string_view xml) {
     return parseXmlPropertyList(bytesOf(xml));
 }
 
 PropertyList read(std::string_view xml) {
-    return valueOf(parse(xml));
+    return valueOf(parseXml(xml));
 }
 
 /// The value of one element inside <plist>.
@@ -26,7 +26,7 @@ PropertyList readValue(std::string_view element) {
 /// Offsets count from the element, without the <plist> before it.
 std::string refusalOfValue(std::string_view element) {
     constexpr std::string_view kOpening = "<plist>";
-    const auto result = parse(std::string(kOpening) + std::string(element) + "</plist>");
+    const auto result = parseXml(std::string(kOpening) + std::string(element) + "</plist>");
     if (result) {
         return "";
     }
@@ -92,7 +92,7 @@ TEST(XmlPropertyListReader, CommentsInstructionsAndSectionsMayPartAText) {
 
 TEST(XmlPropertyListReader, SkipsAByteOrderMark) {
     EXPECT_EQ(read("\xEF\xBB\xBF<plist><string>\u00E9</string></plist>"), PropertyList("\u00E9"));
-    EXPECT_EQ(refusalOf(parse("\xEF\xBB\xBF<plist><int/></plist>")),
+    EXPECT_EQ(refusalOf(parseXml("\xEF\xBB\xBF<plist><int/></plist>")),
               "at byte 10: an unknown element <int>");
 }
 
@@ -178,27 +178,28 @@ TEST(XmlPropertyListReader, RefusesWhatDoesNotBelong) {
     EXPECT_EQ(refusalOfValue("<true>x</true>"), "at byte 0: a text inside a boolean");
     EXPECT_EQ(refusalOfValue("<string>a<b/></string>"), "at byte 9: an element inside <string>");
     EXPECT_EQ(refusalOfValue("<true/><true/>"), "at byte 7: a second value inside <plist>");
-    EXPECT_EQ(refusalOf(parse("<plist/>")), "at byte 0: no value inside <plist>");
-    EXPECT_EQ(refusalOf(parse("<dict/>")), "at byte 0: a root element other than one <plist>");
-    EXPECT_EQ(refusalOf(parse("<plist><true/></plist><plist/>")),
+    EXPECT_EQ(refusalOf(parseXml("<plist/>")), "at byte 0: no value inside <plist>");
+    EXPECT_EQ(refusalOf(parseXml("<dict/>")), "at byte 0: a root element other than one <plist>");
+    EXPECT_EQ(refusalOf(parseXml("<plist><true/></plist><plist/>")),
               "at byte 22: a root element other than one <plist>");
-    EXPECT_EQ(refusalOf(parse("<plist><true/></plist>x")), "at byte 22: a text between elements");
-    EXPECT_EQ(refusalOf(parse("x<plist><true/></plist>")), "at byte 0: a text between elements");
+    EXPECT_EQ(refusalOf(parseXml("<plist><true/></plist>x")),
+              "at byte 22: a text between elements");
+    EXPECT_EQ(refusalOf(parseXml("x<plist><true/></plist>")), "at byte 0: a text between elements");
 }
 
 TEST(XmlPropertyListReader, RefusesAnEmptyInput) {
-    EXPECT_EQ(refusalOf(parse("")), "at byte 0: an empty input");
-    EXPECT_EQ(refusalOf(parse(" \n")), "at byte 0: no <plist> element");
-    EXPECT_EQ(refusalOf(parse("\xEF\xBB\xBF")), "at byte 3: no <plist> element");
-    EXPECT_EQ(refusalOf(parse("<?xml version=\"1.0\"?>")), "at byte 0: no <plist> element");
+    EXPECT_EQ(refusalOf(parseXml("")), "at byte 0: an empty input");
+    EXPECT_EQ(refusalOf(parseXml(" \n")), "at byte 0: no <plist> element");
+    EXPECT_EQ(refusalOf(parseXml("\xEF\xBB\xBF")), "at byte 3: no <plist> element");
+    EXPECT_EQ(refusalOf(parseXml("<?xml version=\"1.0\"?>")), "at byte 0: no <plist> element");
 }
 
 TEST(XmlPropertyListReader, RefusesMalformedXml) {
-    EXPECT_EQ(refusalOf(parse("<plist><true></plist>")),
+    EXPECT_EQ(refusalOf(parseXml("<plist><true></plist>")),
               "at byte 15: malformed XML: Start-end tags mismatch");
-    EXPECT_EQ(refusalOf(parse("<plist><true/>")),
+    EXPECT_EQ(refusalOf(parseXml("<plist><true/>")),
               "at byte 13: malformed XML: Start-end tags mismatch");
-    EXPECT_EQ(refusalOf(parse("<plist><![CDATA[x</plist>")),
+    EXPECT_EQ(refusalOf(parseXml("<plist><![CDATA[x</plist>")),
               "at byte 16: malformed XML: Error parsing CDATA section");
 }
 
@@ -218,7 +219,7 @@ TEST(XmlPropertyListReader, RefusesEntitiesBeyondTheFiveOfXml) {
 }
 
 TEST(XmlPropertyListReader, RefusesADocumentTypeWithDeclarations) {
-    EXPECT_EQ(refusalOf(parse("<!DOCTYPE plist [<!ENTITY a \"x\">]><plist><true/></plist>")),
+    EXPECT_EQ(refusalOf(parseXml("<!DOCTYPE plist [<!ENTITY a \"x\">]><plist><true/></plist>")),
               "at byte 16: a document type with declarations of its own");
     EXPECT_EQ(read("<!DOCTYPE plist SYSTEM '[>]'><plist><true/></plist>"),
               PropertyList::boolean(true));
@@ -242,8 +243,8 @@ TEST(XmlPropertyListReader, RefusesEncodingsOtherThanUtf8) {
     EXPECT_EQ(refusalOfValue("<string>\xC0\x80</string>"), "at byte 8: a byte that is no UTF-8");
     EXPECT_EQ(refusalOfValue("<string>\xED\xA0\x80</string>"),
               "at byte 8: a byte that is no UTF-8");
-    EXPECT_EQ(refusalOf(parse("\xFE\xFF")), "at byte 0: UTF-16, where only UTF-8 is read");
-    EXPECT_EQ(refusalOf(parse("<?xml version='1.0' encoding='latin1'?><plist><true/></plist>")),
+    EXPECT_EQ(refusalOf(parseXml("\xFE\xFF")), "at byte 0: UTF-16, where only UTF-8 is read");
+    EXPECT_EQ(refusalOf(parseXml("<?xml version='1.0' encoding='latin1'?><plist><true/></plist>")),
               "at byte 30: an encoding other than UTF-8");
     EXPECT_EQ(read("<?xml version='1.0' encoding='utf-8'?><plist><true/></plist>"),
               PropertyList::boolean(true));
@@ -254,8 +255,9 @@ TEST(XmlPropertyListReader, NestsContainers512Deep) {
         return "<plist>" + repeated("<array>", depth) + repeated("</array>", depth) + "</plist>";
     };
     EXPECT_EQ(depthOf(read(nested(512))), 512U);
-    EXPECT_EQ(refusalOf(parse(nested(513))), "at byte 3591: containers nested deeper than 512");
-    EXPECT_EQ(refusalOf(parse(nested(1000000))), "at byte 3591: containers nested deeper than 512");
+    EXPECT_EQ(refusalOf(parseXml(nested(513))), "at byte 3591: containers nested deeper than 512");
+    EXPECT_EQ(refusalOf(parseXml(nested(1000000))),
+              "at byte 3591: containers nested deeper than 512");
 }
 
 } // namespace
