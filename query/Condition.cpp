@@ -4,6 +4,7 @@
 #include "query/Database.h"
 #include "query/QueryErrorText.h"
 #include "query/TimelineTables.h"
+#include "text/Format.h"
 #include "timeline/CurrentValues.h"
 #include "timeline/Event.h"
 
@@ -39,6 +40,20 @@ std::string conditionErrorText(QueryError error, std::string_view text, const Da
         error = {"This is not a whole condition.", std::nullopt};
     }
     return queryErrorText(error, text, database.names(), "condition");
+}
+
+/// The query for the texts of the columns of `state` that a condition names; nothing if it names
+/// none.
+std::optional<Query> prepareNamed(Database& database, const Query& condition) {
+    std::string columns;
+    for (const std::string& name : condition.columnsRead("state")) {
+        columns += columns.empty() ? "" : ", ";
+        columns += formatText("CAST([%@] AS TEXT) AS [%@]", {name, name});
+    }
+    if (columns.empty()) {
+        return std::nullopt;
+    }
+    return database.prepare("SELECT " + columns + " FROM state").value();
 }
 
 /// A row without fields.
@@ -198,6 +213,7 @@ struct QueryCondition::Parts {
     Row* row = nullptr; ///< of the database
     Database database;
     std::optional<Query> query; ///< ends before the database
+    std::optional<Query> named;
 };
 
 QueryCondition::QueryCondition(std::unique_ptr<Parts> parts) : _parts(std::move(parts)) {}
@@ -228,6 +244,7 @@ QueryCondition::compile(std::string_view text, const FieldTable& fields, About a
         auto query = prepareCondition(parts->database, *written);
         if (query) {
             parts->query = std::move(query).value();
+            parts->named = prepareNamed(parts->database, *parts->query);
             return std::unique_ptr<QueryCondition>(new QueryCondition(std::move(parts)));
         }
         const std::string name = fields.isObjectStream() ? lateName(query.error()) : std::string();
@@ -262,6 +279,21 @@ Result<bool, std::string> QueryCondition::holds(const Moment& moment, const Curr
         return row.error().sentence;
     }
     return row->has_value();
+}
+
+std::vector<QueryCondition::NamedValue> QueryCondition::named(const Moment& moment,
+                                                              const CurrentValues& values) {
+    std::vector<NamedValue> all;
+    if (_parts->named) {
+        _parts->row->set(moment, values);
+        const auto row = _parts->named->next();
+        for (std::size_t column = 0; row && *row && column < (*row)->size(); ++column) {
+            const auto* text = std::get_if<std::string>(&(**row)[column]);
+            all.push_back({_parts->named->columns()[column], text != nullptr ? *text : ""});
+        }
+        _parts->named->restart();
+    }
+    return all;
 }
 
 std::vector<std::string> QueryCondition::unseen() const {

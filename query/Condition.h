@@ -43,6 +43,12 @@ public:
     /// Whether it holds; NULL does not. An error is a sentence about a value that cannot be
     /// computed.
     Result<bool, std::string> holds(const Moment& moment, const CurrentValues& values);
+    struct NamedValue {
+        std::string column;
+        std::string text; ///< empty for NULL
+    };
+    /// The columns that it names, sorted, and their values.
+    std::vector<NamedValue> named(const Moment& moment, const CurrentValues& values);
     /// The names of fields that an object stream has not shown so far.
     std::vector<std::string> unseen() const;
 

@@ -7,8 +7,10 @@
 #include "query/VirtualTable.h"
 
 #include <algorithm>
+#include <set>
 #include <sqlite3.h>
 #include <stdexcept>
+#include <utility>
 
 namespace pallax {
 
@@ -39,9 +41,12 @@ bool isReading(int action, const char* second) {
 
 /// Allows what only reads. It is asked while a query is prepared; a table that is opened then is
 /// declared meanwhile.
-int authorize(void* data, int action, const char* /*first*/, const char* second,
-              const char* /*schema*/, const char* /*inner*/) {
+int authorize(void* data, int action, const char* first, const char* second, const char* /*schema*/,
+              const char* /*inner*/) {
     auto& authority = *static_cast<Authority*>(data);
+    if (action == SQLITE_READ && first != nullptr && second != nullptr) {
+        authority.reads.push_back({first, second});
+    }
     if (authority.isDeclaring || isReading(action, second)) {
         return SQLITE_OK;
     }
@@ -136,12 +141,23 @@ void Query::Finalize::operator()(sqlite3_stmt* statement) const {
     sqlite3_finalize(statement);
 }
 
-Query::Query(sqlite3& connection, std::unique_ptr<sqlite3_stmt, Finalize> statement)
-    : _connection(&connection), _statement(std::move(statement)) {
+Query::Query(sqlite3& connection, std::unique_ptr<sqlite3_stmt, Finalize> statement,
+             std::vector<ColumnRead> reads)
+    : _connection(&connection), _statement(std::move(statement)), _reads(std::move(reads)) {
     const int count = sqlite3_column_count(_statement.get());
     for (int column = 0; column < count; ++column) {
         _columns.emplace_back(sqlite3_column_name(_statement.get(), column));
     }
+}
+
+std::vector<std::string> Query::columnsRead(std::string_view table) const {
+    std::set<std::string> names;
+    for (const ColumnRead& read : _reads) {
+        if (read.table == table && !read.column.empty()) { // count(*) reads one without a name
+            names.insert(read.column);
+        }
+    }
+    return {names.begin(), names.end()};
 }
 
 Result<std::optional<std::vector<QueryValue>>, QueryError> Query::next() {
@@ -241,6 +257,7 @@ void Database::setMayContinue(std::function<bool()> mayContinue) {
 Result<Query, QueryError> Database::prepare(std::string_view text) {
     sqlite3_set_authorizer(_connection.get(), authorize, _authority.get());
     _authority->hasRefused = false;
+    _authority->reads.clear();
     sqlite3_stmt* statement = nullptr;
     const char* rest = nullptr;
     const auto length = static_cast<int>(std::min<std::size_t>(text.size(), kLongestText));
@@ -264,7 +281,7 @@ Result<Query, QueryError> Database::prepare(std::string_view text) {
     if (text.find_first_not_of(" \t\r\n;", end) != std::string_view::npos) {
         return QueryError{"Only one query can be run.", end};
     }
-    return Query(*_connection, std::move(owned));
+    return Query(*_connection, std::move(owned), std::exchange(_authority->reads, {}));
 }
 
 } // namespace pallax

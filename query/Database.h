@@ -36,11 +36,19 @@ inline constexpr const char* kStopped = "The query was stopped.";
 /// hexadecimal digits, as of hex().
 using QueryValue = std::variant<std::monostate, std::int64_t, double, std::string>;
 
+/// A column that a query names.
+struct ColumnRead {
+    std::string table;
+    std::string column;
+};
+
 /// A query that runs.
 class Query {
 public:
     /// The names of the columns.
     const std::vector<std::string>& columns() const { return _columns; }
+    /// The columns of the table that the query reads, in no particular order, each once.
+    std::vector<std::string> columnsRead(std::string_view table) const;
     /// The next row; nothing after the last.
     Result<std::optional<std::vector<QueryValue>>, QueryError> next();
     /// Runs it again from the first row.
@@ -51,11 +59,13 @@ private:
     struct Finalize {
         void operator()(sqlite3_stmt* statement) const;
     };
-    Query(sqlite3& connection, std::unique_ptr<sqlite3_stmt, Finalize> statement);
+    Query(sqlite3& connection, std::unique_ptr<sqlite3_stmt, Finalize> statement,
+          std::vector<ColumnRead> reads);
 
     sqlite3* _connection;
     std::unique_ptr<sqlite3_stmt, Finalize> _statement;
     std::vector<std::string> _columns;
+    std::vector<ColumnRead> _reads;
 };
 
 /// Tables that answer queries in SQL. Queries can only read; they cannot write,

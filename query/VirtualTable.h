@@ -1,6 +1,9 @@
 #pragma once
 
+#include "query/Database.h"
+
 #include <functional>
+#include <vector>
 
 struct sqlite3;
 
@@ -14,6 +17,7 @@ struct Authority {
     bool isDeclaring = false;
     bool hasRefused = false;                            ///< since it was last set to false
     const std::function<bool()>* mayContinue = nullptr; ///< RowBounds
+    std::vector<ColumnRead> reads = {};                 ///< of the query that is being prepared
 };
 
 /// A table of a connection.

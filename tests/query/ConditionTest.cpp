@@ -1,6 +1,7 @@
 #include "query/Condition.h"
 
 #include "monitor/TickGrid.h"
+#include "tests/doubles/RecordBuilder.h"
 #include "tests/query/QueryFixture.h"
 
 namespace pallax {
@@ -211,6 +212,33 @@ TEST(Condition, TellsWhyAValueCannotBeComputed) {
     const auto holds = (*condition)->holds({{{}, 4}}, reading.values);
     ASSERT_FALSE(holds);
     EXPECT_EQ(holds.error(), "there is no profile \"unknown\"");
+}
+
+TEST(Condition, GivesTheColumnsThatItNamesAsTexts) {
+    TimelineFixture fixture("gsm");
+    fixture.journal.add(Simulation::kStart, doubles::Record(0x7132).u8(2).u8(0).u8(0).prefixed());
+    Reading reading(fixture);
+    const auto named = [&reading](std::string_view text) {
+        const auto condition =
+            QueryCondition::compile(text, reading.fields, About::State, noKnowledge());
+        EXPECT_TRUE(condition) << condition.error();
+        Lines lines;
+        for (const auto& [column, value] : (*condition)->named({reading.moment}, reading.values)) {
+            lines.push_back(column + "=" + value);
+        }
+        return lines;
+    };
+    EXPECT_EQ(
+        named("Process_CO_mm_service_state like 'REG%' and state.packet = packet and tick > 0 and "
+              "[process_co_mm_service_state_age] < 9 and gsm.process_co.mm_service_state <> ''"),
+        (Lines{"packet=0",
+               "process_co_mm_service_state=", "process_co_mm_service_state_age=", "tick="}));
+    ASSERT_TRUE(reading.next());
+    EXPECT_EQ(named("process_co_mm_service_state is not null or [process_co_mm_service_state_age] "
+                    "> 'packet'"),
+              (Lines{"process_co_mm_service_state=REG_STATE_REGISTERING",
+                     "process_co_mm_service_state_age=0.0"}));
+    EXPECT_EQ(named("1"), Lines{});
 }
 
 TEST(Condition, FieldsThatAnObjectStreamHasNotShownYetAreNull) {
