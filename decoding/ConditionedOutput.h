@@ -2,26 +2,14 @@
 
 #include "decoding/DisplayOutput.h"
 #include "decoding/RecordingDecoder.h"
-#include "query/Condition.h"
+#include "decoding/StateCondition.h"
 #include "text/Result.h"
-#include "timeline/CurrentValues.h"
 
 #include <memory>
-#include <stdexcept>
 #include <string>
 #include <vector>
 
 namespace pallax {
-
-/// A value of a condition cannot be computed.
-class ConditionFailure : public std::runtime_error {
-public:
-    explicit ConditionFailure(const std::string& reason)
-        : std::runtime_error("--where: " + reason) {}
-};
-
-/// Sentences, without the name of the recording, about fields of a condition that never came.
-std::vector<std::string> notesOn(const QueryCondition& condition);
 
 /// Passes on the displays of one recording at which a condition holds.
 class ConditionedOutput final : public DisplayOutput {
@@ -36,8 +24,8 @@ public:
     make(DisplayOutput& output, const Request& request, const DecoderEnvironment& environment);
 
     /// Takes the samples of every packet.
-    SampleSink& sink() { return _values; }
-    std::vector<std::string> notes() const { return notesOn(*_condition); }
+    SampleSink& sink() { return _condition->sink(); }
+    std::vector<std::string> notes() const { return _condition->notes(); }
 
     void beginRecording() override { _output.beginRecording(); }
     /// Throws ConditionFailure.
@@ -45,18 +33,12 @@ public:
     void packetDone(const DisplayMoment& moment) override;
 
 private:
-    bool holds(const StateMoment& moment);
-
-    ConditionedOutput(DisplayOutput& output, const Request& request, const Resources& resources)
-        : _output(output), _every(request.every), _fields(request.technology, resources),
-          _values(_fields, _entries) {}
+    ConditionedOutput(DisplayOutput& output, Every every, std::unique_ptr<StateCondition> condition)
+        : _output(output), _every(every), _condition(std::move(condition)) {}
 
     DisplayOutput& _output;
     Every _every;
-    FieldTable _fields;
-    EntryTable _entries;
-    CurrentValues _values;
-    std::unique_ptr<QueryCondition> _condition;
+    std::unique_ptr<StateCondition> _condition;
 };
 
 } // namespace pallax

@@ -2,20 +2,18 @@
 
 #include "LogGenerator/Technologies/Technologies.h"
 #include "console/Output.h"
-#include "decoding/ConditionedOutput.h"
 #include "decoding/DisplayJson.h"
 #include "decoding/DroppedNotices.h"
+#include "decoding/EventLine.h"
 #include "decoding/InstalledKnowledge.h"
+#include "decoding/OpenedParts.h"
 #include "decoding/Preconditions.h"
 #include "decoding/RequiredTemplates.h"
+#include "decoding/StateCondition.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
-#include "host/FileWatch.h"
-#include "host/JoinedRecording.h"
-#include "host/Snapshot.h"
 #include "host/WallClock.h"
 #include "text/Format.h"
-#include "text/Printable.h"
 #include "timeline/Timeline.h"
 
 #include <memory>
@@ -56,15 +54,6 @@ private:
     Recording& _recording;
     std::function<void()> _beforePacket;
 };
-
-/// "2023-11-14 23:13:20.000", in local time.
-std::string localText(Time time, const Clock& zone) {
-    std::string text = isoTimeText(time + zone.zone(time).offset);
-    constexpr std::size_t kSeparator = 10;
-    text[kSeparator] = ' ';
-    text.pop_back(); // the mark of UTC
-    return text;
-}
 
 /// Writes the events that a timeline has found since the last call.
 class EventLines {
@@ -107,18 +96,13 @@ private:
         std::string& text = _output.text();
         if (_form.isJson) {
             appendJson(text, objectOf(event));
+            text += '\n';
         } else {
-            if (_form.areSeveral) {
-                appendPrintable(text, _recording);
-                text.append(": ");
-            }
-            constexpr std::size_t kKindWidth = 18;
-            std::string kind(wordOf(event.kind));
-            kind.resize(kKindWidth, ' ');
-            text.append(localText(event.time, _zone)).append("  ").append(kind);
-            appendPrintable(text, event.words);
+            appendEventLine(text,
+                            {_form.areSeveral ? _recording : std::string_view(), event.time,
+                             wordOf(event.kind), event.words},
+                            _zone);
         }
-        text += '\n';
         _output.lineDone();
     }
 
@@ -162,29 +146,16 @@ ExitStatus EventsCommand::tell(const PartPaths& parts, Output& output) {
     if (const auto missing = missingParts(parts)) {
         _report(*missing);
     }
-    const std::vector<FileWatch> watches(parts.begin(), parts.end());
-    const auto recording = openParts(parts, _open);
-    if (!recording) {
-        _report(recording.error().sentence);
+    const auto opened = OpenedParts::open(parts, _options.technology, _open);
+    if (!opened) {
+        _report(opened.error());
         return kExitFailure;
     }
-    const RecordedTechnology* technology =
-        _options.technology != nullptr ? _options.technology : (*recording)->technology();
-    if (technology == nullptr) {
-        _report((*recording)->foreignLinkType().sentence);
+    const ExitStatus status = tellEvents(opened->recording(), opened->technology(), output);
+    const auto trouble = status == kExitSuccess ? opened->trouble() : std::nullopt;
+    if (trouble) {
+        _report(*trouble);
         return kExitFailure;
-    }
-    if ((*recording)->technology() == &kSnapshotTechnology) {
-        _report(noTimeOfSnapshot(parts.front()).sentence);
-        return kExitFailure;
-    }
-    ExitStatus status = tellEvents(**recording, *technology, output);
-    for (const FileWatch& watch : watches) {
-        const auto trouble = status == kExitSuccess ? watch.trouble() : std::nullopt;
-        if (trouble) {
-            _report(*trouble);
-            status = kExitFailure;
-        }
     }
     return status;
 }
