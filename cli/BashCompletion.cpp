@@ -39,7 +39,7 @@ std::string joined(const std::vector<std::string>& words) {
     return text;
 }
 
-/// The completions of an option's value, as assignments.
+/// The completions of an option's value, as assignments; empty if there are none.
 std::string offerOf(const OptionDescription& option) {
     std::string offer;
     const std::string words = joined(option.choices());
@@ -49,7 +49,11 @@ std::string offerOf(const OptionDescription& option) {
     if (option.takesFile()) {
         offer.append(" files=yes");
     }
-    return offer.empty() ? " :" : offer;
+    return offer;
+}
+
+std::string commandOf(const std::string& offers) {
+    return offers.empty() ? " :" : offers;
 }
 
 /// The values of a command's options, then its option names, then its arguments.
@@ -61,7 +65,7 @@ std::string casesOf(const CommandDescription& command, const std::string& name) 
             options.push_back(each);
             if (!option.value.empty()) {
                 values.append("        '").append(name).append(" ").append(each).append("')");
-                values.append(offerOf(option)).append(" ;;\n");
+                values.append(commandOf(offerOf(option))).append(" ;;\n");
             }
         }
     }
@@ -71,7 +75,7 @@ std::string casesOf(const CommandDescription& command, const std::string& name) 
     }
     return values + "        '" + name + " '*)\n            if [[ $current == -* ]]; then\n" +
            "                words='" + joined(options) + "'\n            else\n" +
-           "               " + (arguments.empty() ? " :" : arguments) + "\n            fi ;;\n";
+           "               " + commandOf(arguments) + "\n            fi ;;\n";
 }
 
 } // namespace

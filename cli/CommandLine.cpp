@@ -104,6 +104,7 @@ CommandLine::CommandLine()
     addSql(addCommand("sql", "Ask a recording in SQL"), _sql);
     addStatus(addCommand("status", "Show the radio in a few lines"), _status);
     addDiff(addCommand("diff", "Compare two recordings, or two moments of one"), _diff);
+    addWatch(addCommand("watch", "Tell when a condition becomes true"), _watch);
     addTexts();
 }
 
@@ -235,6 +236,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("snapshot")) {
         return _snapshot;
+    }
+    if (_app->got_subcommand("watch")) {
+        return _watch;
     }
     return _browse;
 }

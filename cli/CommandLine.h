@@ -43,6 +43,7 @@ private:
     SqlOptions _sql;
     StatusOptions _status;
     DiffOptions _diff;
+    WatchOptions _watch;
     SnapshotOptions _snapshot;
     RecordOptions _record;
     ServiceRequest _service;

@@ -14,6 +14,7 @@
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
 #include "telephony/Service.h"
+#include "watching/WatchCommand.h"
 
 #include <string>
 #include <variant>
@@ -37,7 +38,7 @@ struct ServiceStatusOptions {};
 using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions, InfoOptions,
-                 SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, ParseEnd>;
+                 SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -42,6 +42,7 @@ struct Run {
     ExitStatus operator()(const SqlOptions& options) const { return runSql(options); }
     ExitStatus operator()(const StatusOptions& options) const { return runStatus(options); }
     ExitStatus operator()(const DiffOptions& options) const { return runDiff(options); }
+    ExitStatus operator()(const WatchOptions& options) const { return runWatch(options); }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);

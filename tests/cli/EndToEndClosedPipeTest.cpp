@@ -67,8 +67,9 @@ private:
 TEST_F(EndToEndClosedPipe, EndsHelpAndVersion) {
     endsQuietly({"--help"});
     endsQuietly({"--version"});
-    for (const char* command : {"decode", "record", "service", "demo", "simulate", "events",
-                                "fields", "explain", "info", "snapshot", "sql", "status", "diff"}) {
+    for (const char* command :
+         {"decode", "record", "service", "demo", "simulate", "events", "fields", "explain", "info",
+          "snapshot", "sql", "status", "diff", "watch"}) {
         endsQuietly({command, "--help"});
     }
 }

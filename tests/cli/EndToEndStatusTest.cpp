@@ -289,6 +289,32 @@ TEST_F(EndToEndStatus, OfDiff) {
     expectEveryDocumentedStatus({"diff"});
 }
 
+TEST_F(EndToEndStatus, OfWatch) {
+    const std::string path = fatal();
+    const std::string never = "rssi > 0";
+    ends({{"watch", never, sample}, 0, ""});
+    ends({{"watch", "packet > 3", sample}, 1, ""});
+    ends({{"watch"}, 2, "pallax: CONDITION is required (see pallax watch --help)\n"});
+    ends(
+        {{"watch", "packet >", missing}, 2, "pallax: CONDITION: This is not a whole condition.\n"});
+    ends({{"watch", "packet >"}, 2, "pallax: CONDITION: This is not a whole condition.\n"});
+    ends({{"watch", "tme > 1", sample},
+          2,
+          "pallax: CONDITION: no such column: tme. Did you mean \"time\"? (line 1, column 1 of the "
+          "condition)\n"});
+    ends({{"watch", never, missing}, 3, isMissing});
+    ends({{"watch", never, path}, 3, "pallax: " + path + ": " + fatalReason()});
+    ends({{"watch", "quality('gsm.gsm_set.rssi', packet, 'unknown') is null", sample},
+          3,
+          "pallax: CONDITION: there is no profile \"unknown\"\n"});
+    ends({{"watch", "packet > 3", sample},
+          3,
+          "pallax: Standard output cannot be written: No space left on device.\n",
+          "/dev/null",
+          "/dev/full"});
+    expectEveryDocumentedStatus({"watch"});
+}
+
 TEST_F(EndToEndStatus, OfSql) {
     ends({{"sql", sample, "select count(*) from packet"}, 0, ""});
     ends({{"sql", missing, "select 1"}, 1, isMissing});

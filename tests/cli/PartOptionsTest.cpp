@@ -122,6 +122,33 @@ TEST(Options, ADifferenceIsOfTwoMoments) {
     EXPECT_EQ(ended({"diff", "a", "b", "c"}).status, kExitWrongUsage);
 }
 
+TEST(Options, WatchTakesAConditionAndRecordings) {
+    using namespace std::chrono_literals;
+    const auto plain = parsed<WatchOptions>({"watch", "a > 1"});
+    EXPECT_EQ(plain.condition, "a > 1");
+    EXPECT_TRUE(plain.recordings.empty()) << "the live modem";
+    EXPECT_EQ(plain.technology, nullptr);
+    EXPECT_EQ(plain.needed, 0ns);
+    EXPECT_EQ(plain.command, std::nullopt);
+    EXPECT_FALSE(plain.once);
+    const auto all =
+        parsed<WatchOptions>({"watch", "--for", "10s", "--exec", "echo \"$X\"", "--once",
+                              "--technology", "lte", "a > 1", "b.pcap", "-"});
+    EXPECT_EQ(all.condition, "a > 1");
+    EXPECT_EQ(all.recordings, (std::vector<std::string>{"b.pcap", "-"}));
+    EXPECT_EQ(all.technology->commandName, "lte");
+    EXPECT_EQ(all.needed, 10s);
+    EXPECT_EQ(all.command, "echo \"$X\"");
+    EXPECT_TRUE(all.once);
+    EXPECT_EQ(parsed<WatchOptions>({"watch", "--for", "0.5", "a"}).needed, 500ms);
+    EXPECT_EQ(ended({"watch"}).text, "pallax: CONDITION is required (see pallax watch --help)\n");
+    for (const std::string wrong : {"10m", "s", "0s", "1ss"}) {
+        const ParseEnd end = ended({"watch", "--for", wrong, "a"});
+        EXPECT_EQ(end.status, kExitWrongUsage) << wrong;
+        EXPECT_TRUE(end.text.starts_with("pallax: --for: \"")) << end.text;
+    }
+}
+
 TEST(Options, TheLiveModemStandsForRecordings) {
     using namespace std::chrono_literals;
     EXPECT_FALSE(parsed<EventsOptions>({"events", "a"}).live);

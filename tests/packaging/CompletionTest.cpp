@@ -78,12 +78,13 @@ TEST_F(Completion, BashOffersFilesWhereARecordingOrFileIsTaken) {
     EXPECT_EQ(inBash("pallax dri", 1), "drive.pcap\n");
     EXPECT_EQ(inBash("pallax service --play oth", 3), "other.pcap\n");
     EXPECT_EQ(inBash("pallax simulate -o oth", 3), "other.pcap\n");
+    EXPECT_EQ(inBash("pallax watch condition dr", 3), "drive.pcap\n");
     EXPECT_EQ(inBash("pallax demo dr", 2), "");
 }
 
 TEST_F(Completion, EveryOptionIsInEveryScript) {
     const CommandDescription program = CommandLine().description();
-    ASSERT_EQ(program.commands.size(), 13U);
+    ASSERT_EQ(program.commands.size(), 14U);
     const std::string fish = script("fish");
     for (const CommandDescription& command : program.commands) {
         ASSERT_GE(command.options.size(), 3U);
