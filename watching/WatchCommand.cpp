@@ -13,10 +13,19 @@ constexpr const char* kArgument = "CONDITION";
 
 } // namespace
 
+/// A pipe or the modem may keep the user waiting. Without a technology, they alone tell the fields.
+std::optional<std::string> WatchCommand::errorBeforeReading() const {
+    if (_options.technology == nullptr) {
+        return QueryCondition::errorBeforeFields(_options.condition,
+                                                 _environment.decoder.knowledge);
+    }
+    const auto condition =
+        StateCondition::make(_options.condition, *_options.technology, _environment.decoder);
+    return condition ? std::nullopt : std::optional(condition.error());
+}
+
 ExitStatus WatchCommand::run(Output& output) {
-    // Before a pipe or the modem keeps the user waiting, which alone tell the fields.
-    if (const auto wrong =
-            QueryCondition::errorBeforeFields(_options.condition, _environment.decoder.knowledge)) {
+    if (const auto wrong = errorBeforeReading()) {
         _environment.report(kArgument + (": " + *wrong));
         return kExitWrongUsage;
     }

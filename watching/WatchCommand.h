@@ -48,6 +48,8 @@ public:
     ExitStatus run(Output& output);
 
 private:
+    /// What is wrong with the condition as far as it shows now.
+    std::optional<std::string> errorBeforeReading() const;
     ExitStatus watch(const PartPaths& parts, Output& output);
     ExitStatus watchTicks(Recording& recording, const RecordedTechnology& technology,
                           Output& output);

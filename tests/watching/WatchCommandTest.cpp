@@ -200,6 +200,12 @@ TEST_F(WatchCommandTest, AWrongConditionIsToldBeforeAnythingIsOpened) {
     options.recordings = {"missing.pcap"};
     EXPECT_EQ(run(), kExitWrongUsage);
     EXPECT_EQ(reports, Lines{"CONDITION: This is not a whole condition."});
+    options.condition = "tme > 1";
+    EXPECT_EQ(run(), kExitCouldNotTell) << "only a technology tells the columns";
+    options.technology = technologyOfCommandName("lte");
+    EXPECT_EQ(run(), kExitWrongUsage);
+    EXPECT_EQ(reports, Lines{"CONDITION: no such column: tme. Did you mean \"time\"? (line 1, "
+                             "column 1 of the condition)"});
 }
 
 TEST_F(WatchCommandTest, AColumnThatTheTechnologyDoesNotHaveEndsTheCommand) {
