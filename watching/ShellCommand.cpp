@@ -31,7 +31,7 @@ std::vector<std::string> environmentWith(const WatchAction::Variables& variables
         }
     }
     for (const auto& [name, value] : variables) {
-        all.push_back(name + "=" + value);
+        all.emplace_back(name).append("=").append(value);
     }
     return all;
 }

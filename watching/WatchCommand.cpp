@@ -3,6 +3,7 @@
 #include "console/Output.h"
 #include "decoding/FatalRecord.h"
 #include "decoding/OpenedParts.h"
+#include "text/Format.h"
 #include "watching/TickWatch.h"
 
 namespace pallax {
@@ -26,7 +27,7 @@ std::optional<std::string> WatchCommand::errorBeforeReading() const {
 
 ExitStatus WatchCommand::run(Output& output) {
     if (const auto wrong = errorBeforeReading()) {
-        _environment.report(kArgument + (": " + *wrong));
+        _environment.report(formatText("%@: %@", {kArgument, *wrong}));
         return kExitWrongUsage;
     }
     const std::vector<PartPaths> recordings = joinedParts(_options.recordings, _environment.open);
@@ -70,7 +71,7 @@ ExitStatus WatchCommand::watchTicks(Recording& recording, const RecordedTechnolo
     const auto condition =
         StateCondition::make(_options.condition, technology, _environment.decoder, kArgument);
     if (!condition) {
-        _environment.report(kArgument + (": " + condition.error()));
+        _environment.report(formatText("%@: %@", {kArgument, condition.error()}));
         return kExitWrongUsage;
     }
     TickWatch watch({_options.condition, **condition, _options.needed, recording.name(),
