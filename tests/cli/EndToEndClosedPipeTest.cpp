@@ -24,14 +24,14 @@ protected:
     }
 
     /// Runs the command with a full pipe, so that it cannot write anything, then closes the reader.
-    void endsQuietly(const std::vector<std::string>& arguments) const {
+    void endsQuietly(const std::vector<std::string>& arguments, int status = 0) const {
         SCOPED_TRACE(testing::PrintToString(arguments));
         Descriptor reader(::open(pipe.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));
         Descriptor writer(::open(pipe.c_str(), O_WRONLY | O_NONBLOCK | O_CLOEXEC));
         fill(writer);
         PallaxProcess process(world, arguments, "/dev/null", pipe);
         reader.reset();
-        EXPECT_EQ(process.wait(), 0);
+        EXPECT_EQ(process.wait(), status);
         EXPECT_EQ(process.err(), "");
     }
 
@@ -79,6 +79,10 @@ TEST_F(EndToEndClosedPipe, EndsTheTextsForPackages) {
         endsQuietly({"completion", shell});
     }
     endsQuietly({"manual", "pallax-decode"});
+}
+
+TEST_F(EndToEndClosedPipe, EndsWatchWhichWritesOnlyWhatHeld) {
+    endsQuietly({"watch", "tick = 1", lteDrive}, 1);
 }
 
 TEST_F(EndToEndClosedPipe, EndsInfo) {

@@ -184,6 +184,9 @@ TEST_F(WatchCommandTest, ARecordingThatCannotBeReadIsNotOneWithoutTheCondition) 
     options.condition = "download_frequency = 7";
     EXPECT_EQ(run(), kExitFailure) << "it held before the damage";
     EXPECT_EQ(reports.size(), 2U);
+    options.recordings.erase(options.recordings.begin());
+    options.condition = "download_frequency = 8";
+    EXPECT_EQ(run(), kExitCouldNotTell) << "the damage alone";
 }
 
 TEST_F(WatchCommandTest, ARecordThatThrowsIsLeftOut) {
