@@ -89,6 +89,9 @@ TEST_F(EndToEndDescriptors, StandardOutputDoesNotGoIntoARecording) {
     EXPECT_EQ(shell("PALLAX - --print <gsm-attach.pcap >>gsm-attach.pcap 2>err"), 1);
     EXPECT_EQ(contentOf(world.path("err")),
               "pallax: Standard output would go into the recording of standard input.\n");
+    EXPECT_EQ(shell("PALLAX watch 'tick = 1' gsm-attach.pcap >>gsm-attach.pcap 2>err"), 3);
+    EXPECT_EQ(contentOf(world.path("err")),
+              "pallax: Standard output would go into the recording gsm-attach.pcap.\n");
     EXPECT_EQ(contentOf(world.path("gsm-attach.pcap")), content);
 }
 

@@ -221,6 +221,24 @@ TEST_F(EndToEndWatch, ASignalDoesNotWaitForTheCommand) {
     end(service);
 }
 
+TEST_F(EndToEndWatch, OfTheLiveModemNeedsReadableSettings) {
+    const std::string file = world.path("config/pallax/pallax.conf");
+    std::filesystem::create_directories(world.path("config/pallax"));
+    ASSERT_EQ(::mkfifo(file.c_str(), S_IRUSR | S_IWUSR), 0);
+    const Run run = this->run({"watch", "tick = 1"});
+    EXPECT_EQ(run.status, 3);
+    EXPECT_EQ(run.err, "pallax: " + file + " cannot be read: it is not a regular file.\n");
+}
+
+TEST_F(EndToEndWatch, OfTheLiveModemWithAnotherTechnologyEnds) {
+    PallaxProcess service(world, {"service", "--play", twice()});
+    ASSERT_TRUE(serviceIsThere());
+    const Run run = this->run({"watch", "--technology", "lte", "tick = 1"});
+    EXPECT_EQ(run.status, 3);
+    EXPECT_EQ(run.err, "pallax: The modem's technology is Zorell_GSM (gsm), not lte.\n");
+    end(service);
+}
+
 TEST_F(EndToEndWatch, WithoutAModemASignalEndsIt) {
     PallaxProcess watch(world, {"watch", "tick = 1"});
     ASSERT_TRUE(watch.says("pallax: No telephony service is running; waiting.\n"));
