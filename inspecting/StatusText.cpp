@@ -1,12 +1,11 @@
 #include "inspecting/StatusText.h"
 
 #include "decoding/DisplayJson.h"
-#include "knowledge/Channels.h"
+#include "overview/StatusWords.h"
 #include "text/Format.h"
 #include "text/Printable.h"
 #include "text/Utf8.h"
 
-#include <algorithm>
 #include <cmath>
 
 namespace pallax {
@@ -18,18 +17,6 @@ constexpr std::string_view kBetween = " · ";
 constexpr std::size_t kLabelWidth = 12;
 constexpr std::size_t kLines = 10; // more than there are kinds of rows
 constexpr std::size_t kNeighbours = 3;
-
-std::string ageText(std::chrono::nanoseconds age) {
-    using namespace std::chrono;
-    if (age < minutes(2)) {
-        return formatText("%lld s ago", {round<seconds>(age).count()});
-    }
-    if (age < hours(2)) {
-        return formatText("%lld min ago", {floor<minutes>(age).count()});
-    }
-    return age < days(2) ? formatText("%lld h ago", {floor<hours>(age).count()})
-                         : formatText("%lld days ago", {floor<days>(age).count()});
-}
 
 std::size_t widthOf(const std::string& text) {
     std::size_t width = 0;
@@ -61,14 +48,9 @@ struct Row {
     void add(std::string_view name, std::string_view text) {
         add(std::string(name) + " " + std::string(text));
     }
-    /// Adds the age of the oldest of the values, if it is old.
-    void addAge(Time now, const std::vector<const StatusValue*>& values) {
-        std::chrono::nanoseconds oldest{0};
-        for (const StatusValue* value : values) {
-            oldest = std::max<std::chrono::nanoseconds>(oldest, now - value->read);
-        }
-        if (oldest > kFresh) {
-            add(ageText(oldest));
+    void add(const std::vector<std::string>& all) {
+        for (const std::string& piece : all) {
+            add(piece);
         }
     }
     /// At most `most` lines, broken between pieces.
@@ -131,14 +113,8 @@ std::vector<Row> StatusRows::rows(const StatusOrigin& origin) const {
 }
 
 Row StatusRows::operatorRow(const StatusOperator& network) {
-    std::string name = network.name;
-    if (network.code) {
-        name.append(name.empty() ? "" : " ").append(network.code->mcc).append("-");
-        name.append(network.code->mnc);
-    }
-    name.append(network.country.empty() ? "" : " (" + network.country + ")");
     Row row{"operator"};
-    row.add(name);
+    row.add(operatorWords(network));
     row.add(network.isHome ? "home network" : "");
     if (!network.name.empty()) {
         row.add("name from", nameOf(network.source));
@@ -148,25 +124,17 @@ Row StatusRows::operatorRow(const StatusOperator& network) {
 
 Row StatusRows::cellRow(const StatusCell& cell) const {
     Row row{systemOf(cell) + "cell"};
-    row.add(cell.site);
+    row.add(identityWords(cell));
     std::vector<const StatusValue*> values;
     for (const StatusValue& part : cell.identity) {
-        if (part.name != "cell") { // it is the site
-            row.add(part.name, part.text);
-        }
         values.push_back(&part);
     }
-    row.addAge(_status.time, values);
+    row.add(oldAgeWords(_status.time, values));
     if (!cell.channel) {
         return row;
     }
-    row.add(cell.channel->name, cell.channel->text);
-    row.add(cell.band.empty() ? "" : "band " + cell.band);
-    if (cell.megahertz) {
-        constexpr double kHertz = 1e6;
-        row.add(megahertzText(static_cast<Hertz>(std::llround(*cell.megahertz * kHertz))) + " MHz");
-    }
-    row.addAge(_status.time, {&*cell.channel});
+    row.add(channelWords(cell));
+    row.add(oldAgeWords(_status.time, {&*cell.channel}));
     return row;
 }
 
@@ -178,13 +146,13 @@ Row StatusRows::levelRow() const {
         for (const StatusValue& level : cell.levels) {
             std::string text = systemOf(cell) + level.name + " " + level.text;
             if (level.grade) {
-                text.append(" ").append(nameOf(*level.grade));
+                text.append(" ").append(qualityWord(level));
                 isGraded = true;
             }
             row.add(text);
             values.push_back(&level);
         }
-        row.addAge(_status.time, values);
+        row.add(oldAgeWords(_status.time, values));
     }
     if (isGraded) { // in front, where it is never cut off
         row.pieces.insert(row.pieces.begin(), "profile " + _status.profile);
@@ -195,8 +163,7 @@ Row StatusRows::levelRow() const {
 Row StatusRows::stateRow() const {
     Row row{"state"};
     for (const StatusValue& state : _status.states) {
-        const bool namesItself = state.text.starts_with(state.name + "_"); // "MM_IDLE"
-        row.add(namesItself ? state.text : state.name + " " + state.text);
+        row.add(stateWords(state));
     }
     return row;
 }
@@ -211,14 +178,14 @@ Row StatusRows::neighbourRow() const {
         row.add(neighbour.cell, neighbour.level.text);
         values.push_back(&neighbour.level);
     }
-    row.addAge(_status.time, values);
+    row.add(oldAgeWords(_status.time, values));
     return row;
 }
 
 Row StatusRows::contextRow() const {
     Row row{"contexts"};
     for (const StatusContext& context : _status.contexts) {
-        row.add(context.state.empty() ? context.name : context.name + " " + context.state);
+        row.add(contextWords(context));
     }
     return row;
 }

@@ -19,20 +19,23 @@ struct MeasureInfo {
     std::string_view name; ///< "rsrp", as in profiles
     std::string_view unit; ///< empty if it has none
     std::string_view meaning;
+    double worst; ///< of the values that are usual: where a bar is empty
+    double best;  ///< where it is full
 };
 
 inline constexpr auto kMeasures = std::to_array<MeasureInfo>({
-    {Measure::Rsrp, "rsrp", "dBm", "LTE reference signal received power"},
-    {Measure::Rsrq, "rsrq", "dB", "LTE reference signal received quality"},
-    {Measure::Sinr, "sinr", "dB", "LTE signal to interference and noise ratio"},
-    {Measure::Rssi, "rssi", "dBm", "LTE received signal strength over the whole bandwidth"},
-    {Measure::Rscp, "rscp", "dBm", "UMTS received signal code power"},
-    {Measure::EcNo, "ecno", "dB", "UMTS energy per chip over noise (Ec/No, Ec/Io)"},
-    {Measure::RxLev, "rxlev", "dBm", "GSM receive level"},
-    {Measure::RxQual, "rxqual", "", "GSM receive quality, 0 (best) to 7"},
-    {Measure::CdmaRssi, "cdma-rssi", "dBm", "CDMA 1x received power"},
-    {Measure::EvdoRssi, "evdo-rssi", "dBm", "CDMA EV-DO received power"},
-    {Measure::EcIo, "ecio", "dB", "CDMA 1x pilot energy per chip over received power"},
+    {Measure::Rsrp, "rsrp", "dBm", "LTE reference signal received power", -140, -44},
+    {Measure::Rsrq, "rsrq", "dB", "LTE reference signal received quality", -20, -3},
+    {Measure::Sinr, "sinr", "dB", "LTE signal to interference and noise ratio", -20, 30},
+    {Measure::Rssi, "rssi", "dBm", "LTE received signal strength over the whole bandwidth", -110,
+     -30},
+    {Measure::Rscp, "rscp", "dBm", "UMTS received signal code power", -120, -25},
+    {Measure::EcNo, "ecno", "dB", "UMTS energy per chip over noise (Ec/No, Ec/Io)", -24, 0},
+    {Measure::RxLev, "rxlev", "dBm", "GSM receive level", -110, -48},
+    {Measure::RxQual, "rxqual", "", "GSM receive quality, 0 (best) to 7", 7, 0},
+    {Measure::CdmaRssi, "cdma-rssi", "dBm", "CDMA 1x received power", -110, -40},
+    {Measure::EvdoRssi, "evdo-rssi", "dBm", "CDMA EV-DO received power", -110, -40},
+    {Measure::EcIo, "ecio", "dB", "CDMA 1x pilot energy per chip over received power", -24, 0},
 });
 
 const MeasureInfo& infoOf(Measure measure);
