@@ -1,0 +1,94 @@
+#pragma once
+
+#include "overview/Status.h"
+#include "packets/StampSequence.h"
+#include "timeline/Event.h"
+#include "timeline/EventFinder.h"
+
+#include <memory>
+#include <string_view>
+#include <vector>
+
+namespace pallax {
+
+class Resources;
+
+/// What is known about the radio at one time, for a screen.
+struct Overview {
+    Status status;
+    std::vector<Event> events;     ///< the latest last
+    std::chrono::seconds ahead{0}; ///< local time minus UTC
+};
+
+/// Takes the samples of a live model, so that the status can be asked for at any time.
+class StatusWatch final : public SampleSink, private CurrentValues::Listener {
+public:
+    /// Earlier events are forgotten.
+    static constexpr std::size_t kMostEvents = 32;
+
+    /// `resources` must outlive the watch.
+    explicit StatusWatch(const Resources& resources) : _resources(resources) {}
+    StatusWatch(const StatusWatch&) = delete;
+    StatusWatch& operator=(const StatusWatch&) = delete;
+
+    /// Forgets everything. The samples that follow are of the technology with this identifier
+    /// ("Zorell_LTE"); of an unknown technology, they are dropped. Not during a packet.
+    void begin(std::string_view technology);
+
+    Overview overview(Time time, const NetworkNames& names, const QualityProfile& profile) const;
+
+    void beginPacket(const SamplePacket& packet) override;
+    void endPacket() override;
+    void beginSection(std::string_view section) override {
+        give([&](CurrentValues& to) { to.beginSection(section); });
+    }
+    void sample(const Sample& sample) override {
+        give([&](CurrentValues& to) { to.sample(sample); });
+    }
+    void keyRemoved(std::string_view key) override {
+        give([&](CurrentValues& to) { to.keyRemoved(key); });
+    }
+    void beginList(const SampleList& list) override {
+        give([&](CurrentValues& to) { to.beginList(list); });
+    }
+    void endList() override {
+        give([](CurrentValues& to) { to.endList(); });
+    }
+    void beginEntry(std::size_t index, std::int64_t name) override {
+        give([&](CurrentValues& to) { to.beginEntry(index, name); });
+    }
+    void endEntry() override {
+        give([](CurrentValues& to) { to.endEntry(); });
+    }
+
+private:
+    /// What is known since the technology began.
+    struct Known {
+        Known(const RecordedTechnology& technology, const Resources& resources);
+
+        FieldTable fields;
+        EntryTable entries;
+        CurrentValues values;
+        EventFinder finder;
+        StampSequence stamps;
+        SamplePacket packet; ///< the current one
+        std::vector<Event> events;
+    };
+
+    template <class Give>
+    void give(const Give& samples) {
+        if (_known) {
+            samples(_known->values);
+        }
+    }
+    void valueRead(FieldIndex field, EntryId /*entry*/, const FieldValue& value) override {
+        _known->finder.valueRead(field, value);
+    }
+    void valueRemoved(FieldIndex field) override { _known->finder.valueRemoved(field); }
+    void listReplaced(ListId list) override { _known->finder.listReplaced(list); }
+
+    const Resources& _resources;
+    std::unique_ptr<Known> _known; ///< null without a technology
+};
+
+} // namespace pallax

@@ -1,0 +1,117 @@
+#include "overview/StatusWatch.h"
+
+#include "LogGenerator/Technologies/Technologies.h"
+#include "decoding/DroppedNotices.h"
+#include "monitor/DisplayDriver.h"
+#include "tests/doubles/FakeBundle.h"
+#include "tests/doubles/ManualClock.h"
+#include "tests/timeline/TimelineFixture.h"
+
+#include <string>
+
+namespace pallax {
+namespace {
+
+using namespace std::chrono_literals;
+
+/// A driver that a watch follows, and a timeline of the same packets.
+class Watched {
+public:
+    explicit Watched(const char* technology) : recorded(technology) {
+        driver.setGenerator(LogGenerator::generatorFromTechnology(
+            Text(recorded.technology.identifier), technologies(),
+            {clock, resources, bundle, drop}));
+        driver.addSampleSink(watch);
+        watch.begin(recorded.technology.identifier);
+    }
+
+    /// Gives the packets of the journal from `first` on, later by so much.
+    void play(std::uint64_t first = 1, std::chrono::nanoseconds later = 0ns) {
+        for (std::uint64_t number = first; number <= recorded.journal.size(); ++number) {
+            const JournalPacket packet = recorded.journal.packet(number);
+            driver.update(packet.data, {number, packet.time + later});
+            end = packet.time + later;
+        }
+    }
+    Overview overview() const {
+        return watch.overview(end, NetworkNames(), *builtInProfile(kDefaultProfile));
+    }
+
+    TimelineFixture recorded;
+    DirectoryResources resources{PALLAX_SOURCE_DIR "/resources"};
+    doubles::FakeBundle bundle;
+    doubles::ManualClock clock;
+    DroppedNotices drop;
+    StatusWatch watch{resources};
+    DisplayDriver driver;
+    Time end;
+};
+
+std::string wordsOf(const Status& status) {
+    std::string words;
+    for (const StatusCell& cell : status.cells) {
+        words += cell.system + " " + cell.site + "\n";
+        for (const StatusValue& level : cell.levels) {
+            words += level.name + " " + level.text + "\n";
+        }
+    }
+    for (const StatusNeighbour& neighbour : status.neighbours) {
+        words += neighbour.cell + " " + neighbour.level.text + "\n";
+    }
+    for (const StatusValue& state : status.states) {
+        words += state.name + " " + state.text + "\n";
+    }
+    return words + std::to_string(status.contexts.size());
+}
+
+TEST(StatusWatch, KnowsWhatATimelineOfTheSamePacketsKnows) {
+    for (const RecordedTechnology& each : recordedTechnologies()) {
+        Watched watched(each.commandName.data());
+        watched.recorded.drive(3, 60s, 20);
+        watched.play();
+        const auto timeline = watched.recorded.indexed();
+        const Status expected = statusOf(timeline->valuesAt(timeline->packets()), watched.end,
+                                         NetworkNames(), *builtInProfile(kDefaultProfile));
+        const Overview overview = watched.overview();
+        EXPECT_EQ(wordsOf(overview.status), wordsOf(expected)) << each.commandName;
+        EXPECT_FALSE(overview.status.isEmpty()) << each.commandName;
+
+        const auto& events = timeline->events();
+        ASSERT_FALSE(events.empty()) << each.commandName;
+        EXPECT_EQ(overview.events.size(), std::min(events.size(), StatusWatch::kMostEvents));
+        EXPECT_EQ(overview.events.back().words, events.back().words);
+        EXPECT_EQ(overview.events.back().time, events.back().time);
+        EXPECT_EQ(overview.events.back().packet, events.back().packet);
+    }
+}
+
+TEST(StatusWatch, ForgetsEverythingWhenATechnologyBegins) {
+    Watched watched("lte");
+    watched.recorded.drive(3, 10s);
+    watched.play();
+    ASSERT_FALSE(watched.overview().status.isEmpty());
+    watched.watch.begin(watched.recorded.technology.identifier);
+    EXPECT_TRUE(watched.overview().status.isEmpty());
+    EXPECT_TRUE(watched.overview().events.empty());
+    watched.play();
+    EXPECT_FALSE(watched.overview().status.isEmpty());
+    watched.watch.begin("Another");
+    watched.play();
+    EXPECT_TRUE(watched.overview().status.isEmpty());
+}
+
+TEST(StatusWatch, DoesNotTellATimeAcrossAGap) {
+    Watched watched("lte");
+    watched.recorded.drive(3, 60s);
+    watched.play();
+    watched.play(1, 10min); // the first packets show another cell than the last ones
+    const std::vector<Event> events = watched.overview().events;
+    const auto first = std::find_if(events.begin(), events.end(), [](const Event& event) {
+        return event.kind == EventKind::CellChange && event.time > Simulation::kStart + 5min;
+    });
+    ASSERT_NE(first, events.end());
+    EXPECT_EQ(first->words.find(" after "), std::string::npos) << first->words;
+}
+
+} // namespace
+} // namespace pallax
