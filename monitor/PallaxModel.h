@@ -72,6 +72,10 @@ public:
         _frameObservers.push_back(std::move(observer));
     }
 
+    /// As in DisplayDriver.
+    void addSampleSink(SampleSink& sink) { _driver.addSampleSink(sink); }
+    void removeSampleSink(const SampleSink& sink) { _driver.removeSampleSink(sink); }
+
 private:
     void setGenerator(std::unique_ptr<LogGenerator> generator) override {
         _driver.setGenerator(std::move(generator));

@@ -3,6 +3,7 @@
 #include "ui/terminal/Grid.h"
 #include "ui/terminal/Keys.h"
 #include "ui/terminal/Marks.h"
+#include "ui/terminal/Scrolling.h"
 
 namespace pallax::terminal {
 
@@ -16,12 +17,8 @@ public:
     void draw(Grid& grid, const Marks& marks);
 
 private:
-    int lastFirst() const;
-
     bool _isOpen = false;
-    int _first = 0;
-    int _rows = 0;  ///< rows that fit when last drawn
-    int _lines = 0; ///< lines when last drawn
+    Scrolling _scrolling;
 };
 
 } // namespace pallax::terminal

@@ -31,6 +31,11 @@ struct KeyEvent {
     int y = 0;              ///< its row
 };
 
+/// The key of a character.
+constexpr KeyEvent typed(char32_t character) {
+    return {.key = Key::Character, .character = character};
+}
+
 /// The character that a letter sends with the control key.
 constexpr char32_t controlKey(char letter) {
     return static_cast<char32_t>(letter - 'a' + 1);

@@ -13,23 +13,9 @@ namespace pallax::terminal {
 
 namespace {
 
-constexpr int kTitleRow = 0;
-constexpr int kFirstTableRow = 2;
-constexpr int kRowsBelowTable = 2;
-constexpr int kMargin = 1; // before title and status
-constexpr int kGap = 2;    // between texts of one row
-constexpr std::string_view kClearFilter = "Esc clear filter";
+constexpr Hint kClearFilter{"Esc clear filter", {.key = Key::Escape}};
 constexpr Style kBold{.bold = true};
 constexpr Style kDim{.dim = true};
-
-const ui::Label* labelOf(const ui::BarItems& items) {
-    for (const ui::BarItem& item : items) {
-        if (const auto* label = std::get_if<ui::Label>(&item)) {
-            return label;
-        }
-    }
-    return nullptr;
-}
 
 /// The titles from `first` on, joined, after a mark if some are omitted.
 std::string breadcrumbs(const TerminalNavigation& navigation, const Marks& marks,
@@ -75,39 +61,24 @@ Range wholeCharacters(std::string_view text, Range range) {
 
 } // namespace
 
-const ui::SaveButton* saveButtonOf(const ui::BarItems& items) {
-    for (const ui::BarItem& item : items) {
-        if (const auto* button = std::get_if<ui::SaveButton>(&item)) {
-            return button;
-        }
-    }
-    return nullptr;
-}
-
-bool isLoading(const ui::BarItems& items) {
-    return std::any_of(items.begin(), items.end(), [](const ui::BarItem& item) {
-        const auto* indicator = std::get_if<ui::ActivityIndicator>(&item);
-        return indicator != nullptr && indicator->isSpinning;
-    });
-}
-
 void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
     TerminalTable& table = terminalTable(navigation.top().table());
-    const int rows = std::max(_grid.rows() - kFirstTableRow - kRowsBelowTable, 0);
+    const int rows = std::max(_grid.rows() - kRowsAbove - kRowsBelow, 0);
     table.setViewport(static_cast<std::size_t>(rows), rowContentBounds(_grid.columns()));
-    drawTitle(navigation, table, status.origin);
+    Bars bars(_grid, _marks, _hits, status);
+    drawTitle(navigation, table, bars);
     drawRows(table);
-    drawUpperRule(table, status);
-    const int ruleRight = drawLowerRule(table, static_cast<std::size_t>(rows), status);
+    drawUpperRule(table, bars, status);
+    const int ruleRight = drawLowerRule(table, static_cast<std::size_t>(rows), bars);
     if (status.filterEditor != nullptr) {
-        drawFilterPrompt(*status.filterEditor, status);
+        drawFilterPrompt(*status.filterEditor, bars);
     } else if (navigation.isToolbarShown()) {
-        drawToolbar(navigation, table, status, ruleRight);
+        const ui::BarItems& items = navigation.top().toolbarItems();
+        drawHints(items, table, bars.drawStatus(items, ruleRight), bars);
     }
 }
 
-void PaneView::drawTitle(TerminalNavigation& navigation, TerminalTable& table,
-                         const Origin& origin) {
+void PaneView::drawTitle(TerminalNavigation& navigation, TerminalTable& table, Bars& bars) {
     int right = _grid.columns() - kMargin;
     const PaneModel& pane = table.pane();
     if (!pane.filter().empty()) {
@@ -119,12 +90,7 @@ void PaneView::drawTitle(TerminalNavigation& navigation, TerminalTable& table,
     }
     // The full path has priority.
     const int path = columnsOf(breadcrumbs(navigation, _marks, 0));
-    const std::string beside = originText(origin, _marks, right - kMargin - path - kGap);
-    if (!beside.empty()) {
-        _grid.put(right - columnsOf(beside), kTitleRow, beside, kDim);
-        right -= columnsOf(beside) + kGap;
-    }
-    drawBreadcrumbs(navigation, right);
+    drawBreadcrumbs(navigation, bars.drawOrigin(right, right - kMargin - path - kGap));
 }
 
 /// A click on a title goes back to its pane; a click on the mark, to the last omitted pane.
@@ -150,51 +116,30 @@ void PaneView::drawBreadcrumbs(TerminalNavigation& navigation, int right) {
     }
 }
 
-/// Shows the number of rows outside the window at the end of the rule; returns its first column. A
-/// click acts like the key.
-int PaneView::drawHiddenRows(int y, std::string_view mark, std::size_t rows, Key key,
-                             const PaneStatus& status) {
-    if (rows == 0) {
-        return _grid.columns() - kMargin;
-    }
-    const int right = _grid.columns() - kMargin - 1;
-    std::string text = " ";
-    text.append(mark).append(1, ' ').append(std::to_string(rows)).append(1, ' ');
-    const int left = right - columnsOf(text);
-    _grid.put(left, y, text);
-    _hits.add(left, y, right - left, 1, [press = status.press, key] { press({.key = key}); });
-    return left;
-}
-
 /// Also says that the values are old, if they are.
-void PaneView::drawUpperRule(const TerminalTable& table, const PaneStatus& status) {
-    constexpr int kRow = kFirstTableRow - 1;
-    _grid.fill({kMargin, _grid.columns() - kMargin}, kRow, _marks.horizontal, kDim);
-    const int right = drawHiddenRows(kRow, _marks.up, table.firstShown(), Key::PageUp, status);
+void PaneView::drawUpperRule(const TerminalTable& table, Bars& bars, const PaneStatus& status) {
+    constexpr int kRow = kRowsAbove - 1;
+    const int right = bars.drawRule(kRow, _marks.up, table.firstShown(), Key::PageUp);
     if (status.oldValues.empty()) {
         return;
     }
     const std::string text = oldValuesText(status.oldValues, right - kMargin);
     const int end = _grid.put(kMargin, kRow, text + " ", kBold, {kMargin, right});
-    _hits.add(kMargin, kRow, end - kMargin, 1,
-              [press = status.press] { press({.key = Key::Character, .character = U'R'}); });
+    _hits.add(kMargin, kRow, end - kMargin, 1, [press = status.press] { press(typed(U'R')); });
 }
 
 /// Returns the first column of the number of hidden rows.
-int PaneView::drawLowerRule(const TerminalTable& table, std::size_t windowRows,
-                            const PaneStatus& status) {
-    const int row = _grid.rows() - kRowsBelowTable;
-    _grid.fill({kMargin, _grid.columns() - kMargin}, row, _marks.horizontal, kDim);
+int PaneView::drawLowerRule(const TerminalTable& table, std::size_t windowRows, Bars& bars) {
     const std::size_t end = table.firstShown() + windowRows;
     const std::size_t shown = table.pane().shownRows();
     const std::size_t below = shown - std::min(end, shown);
-    return drawHiddenRows(row, _marks.down, below, Key::PageDown, status);
+    return bars.drawRule(_grid.rows() - kRowsBelow, _marks.down, below, Key::PageDown);
 }
 
 void PaneView::drawRows(TerminalTable& table) {
-    const int end = _grid.rows() - kRowsBelowTable;
+    const int end = _grid.rows() - kRowsBelow;
     std::size_t shown = table.firstShown();
-    for (int y = kFirstTableRow; y < end && shown < table.pane().shownRows(); ++y, ++shown) {
+    for (int y = kRowsAbove; y < end && shown < table.pane().shownRows(); ++y, ++shown) {
         drawRow(table, shown, y);
     }
 }
@@ -266,90 +211,23 @@ void PaneView::drawLabel(const ui::Label& label, int x, int y, Style style, Span
     _grid.put(x, y, text.substr(found.end), style, clip);
 }
 
-void PaneView::drawToolbar(const TerminalNavigation& navigation, const TerminalTable& table,
-                           const PaneStatus& status, int ruleRight) {
-    const ui::BarItems& items = navigation.top().toolbarItems();
-    const int end = drawStatus(items, status, ruleRight);
-    drawHints(items, table, end, status);
-}
-
-/// A text that does not fit is cut at its beginning, because times and file names are at its end.
-int PaneView::drawCutInFront(int x, int y, std::string_view text) {
-    const int right = _grid.columns() - kMargin;
-    const int beyond = x + columnsOf(text) - right;
-    if (beyond <= 0) {
-        return _grid.put(x, y, text);
-    }
-    const int start = _grid.put(x, y, _marks.more, kDim);
-    (void)_grid.put(x - beyond, y, text, {}, {start, right});
-    return right;
-}
-
-int PaneView::drawStatus(const ui::BarItems& items, const PaneStatus& status, int ruleRight) {
-    const int y = _grid.rows() - 1;
-    int x = kMargin;
-    if (status.message) {
-        return drawCutInFront(x, y, *status.message);
-    }
-    if (isLoading(items)) {
-        x = _grid.put(x, y, _marks.spinner.at(status.spinnerTurn % _marks.spinner.size())) + 1;
-    }
-    if (const ui::Label* label = labelOf(items)) {
-        x = drawCutInFront(x, y, label->text);
-        const bool hasTime = !isLoading(items) && !label->text.empty();
-        if (hasTime && x + 1 + columnsOf(status.zone) <= _grid.columns() - kMargin) {
-            x = status.zone.empty() ? x : _grid.put(x + 1, y, status.zone, kDim);
-        }
-    }
-    if (status.note.empty()) {
-        return x;
-    }
-    if (x + kGap + columnsOf(status.note) <= _grid.columns() - kMargin) {
-        return _grid.put(x + kGap, y, status.note, kDim);
-    }
-    (void)_grid.put(kMargin, y - 1, status.note + " ", {}, {kMargin, ruleRight}); // in the rule
-    return x;
-}
-
-void PaneView::drawHint(int left, std::string_view text, const KeyEvent& key,
-                        const PaneStatus& status) {
-    const int y = _grid.rows() - 1;
-    const int end = _grid.put(left, y, text, kDim);
-    _hits.add(left, y, end - left, 1, [press = status.press, key] { press(key); });
-}
-
-/// The most useful keys, as many as fit after the status; a click acts like the key.
+/// The most useful keys.
 void PaneView::drawHints(const ui::BarItems& items, const TerminalTable& table, int from,
-                         const PaneStatus& status) {
-    const auto character = [](char32_t key) {
-        return KeyEvent{.key = Key::Character, .character = key};
-    };
-    std::vector<std::pair<std::string_view, KeyEvent>> hints;
+                         Bars& bars) {
+    std::vector<Hint> hints;
     if (!table.pane().filter().empty()) {
-        hints.emplace_back(kClearFilter, KeyEvent{.key = Key::Escape});
+        hints.push_back(kClearFilter);
     } else if (table.pane().totalRows() > 0) {
-        hints.emplace_back("/ filter", character(U'/'));
+        hints.push_back({"/ filter", typed(U'/')});
     }
     if (saveButtonOf(items) != nullptr) {
-        hints.emplace_back("s Save", character(U's'));
+        hints.push_back({"s Save", typed(U's')});
     }
-    hints.emplace_back("? help", character(U'?'));
-    int right = _grid.columns() - kMargin;
-    for (auto hint = hints.rbegin(); hint != hints.rend(); ++hint) {
-        const int left = right - columnsOf(hint->first);
-        if (left < from + kGap) {
-            break;
-        }
-        drawHint(left, hint->first, hint->second, status);
-        right = left - kGap;
-    }
-    const bool isHelpLeftOut = right == _grid.columns() - kMargin;
-    if (isHelpLeftOut && right - 1 > from) {
-        drawHint(right - 1, "?", character(U'?'), status);
-    }
+    hints.push_back({"? help", typed(U'?')});
+    bars.drawHints(hints, from);
 }
 
-void PaneView::drawFilterPrompt(const LineEditor& editor, const PaneStatus& status) {
+void PaneView::drawFilterPrompt(const LineEditor& editor, Bars& bars) {
     const int y = _grid.rows() - 1;
     const int start = kMargin + 2; // after "/ "
     const int cursor = columnsOf(std::string_view(editor.text()).substr(0, editor.cursor()));
@@ -359,9 +237,9 @@ void PaneView::drawFilterPrompt(const LineEditor& editor, const PaneStatus& stat
     _grid.put(kMargin, y, "/", kBold);
     const int end = _grid.put(start - offset, y, editor.text(), {}, {start, last});
     _grid.setCursor({start + cursor - offset, y});
-    const int left = _grid.columns() - kMargin - columnsOf(kClearFilter);
+    const int left = _grid.columns() - kMargin - columnsOf(kClearFilter.text);
     if (left > end + 1) {
-        drawHint(left, kClearFilter, {.key = Key::Escape}, status);
+        bars.drawHint(left, kClearFilter.text, kClearFilter.key);
     }
 }
 

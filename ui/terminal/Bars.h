@@ -1,0 +1,80 @@
+#pragma once
+
+#include "platform/ui/Views.h"
+#include "ui/terminal/Grid.h"
+#include "ui/terminal/HitMap.h"
+#include "ui/terminal/Keys.h"
+#include "ui/terminal/Marks.h"
+#include "ui/terminal/Origin.h"
+
+#include <cstddef>
+#include <functional>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace pallax::terminal {
+
+class LineEditor;
+
+/// The rows around a screen's content: title and rule above it, rule and status below it.
+inline constexpr int kTitleRow = 0;
+inline constexpr int kRowsAbove = 2;
+inline constexpr int kRowsBelow = 2;
+inline constexpr int kMargin = 1; ///< columns before title and status
+inline constexpr int kGap = 2;    ///< columns between texts of one row
+
+/// What is shown around the content besides the pane's own items.
+struct PaneStatus {
+    std::size_t spinnerTurn = 0;              ///< increases while the spinner turns
+    const LineEditor* filterEditor = nullptr; ///< while a filter is being typed
+    std::optional<std::string> message;       ///< replaces the status text
+    std::string note;      ///< after the status text, or in the rule above if it does not fit
+    Origin origin;         ///< in the title
+    std::string oldValues; ///< the time of values that are no longer updated
+    std::string zone;      ///< for the time in the status text
+    std::function<void(const KeyEvent&)> press = [](const KeyEvent&) {}; ///< by a click
+};
+
+/// Whether the toolbar's activity indicator is animated.
+bool isLoading(const ui::BarItems& items);
+/// The toolbar's save button, or null.
+const ui::SaveButton* saveButtonOf(const ui::BarItems& items);
+
+/// A key that is offered in the last row.
+struct Hint {
+    std::string_view text; ///< "? help"
+    KeyEvent key;
+};
+
+/// Draws parts of the rows around the content. What can be clicked acts like a key.
+class Bars {
+public:
+    Bars(Grid& grid, const Marks& marks, HitMap& hits, const PaneStatus& status)
+        : _grid(grid), _marks(marks), _hits(hits), _status(status) {}
+
+    /// The origin of the values in at most `columns` columns of the title row, before column
+    /// `right`. Returns where the room for the title ends.
+    int drawOrigin(int right, int columns);
+    /// A rule that ends with the number of rows outside the window; returns the first column of the
+    /// number.
+    int drawRule(int y, std::string_view mark, std::size_t hiddenRows, Key key);
+    /// The status in the last row; a note that does not fit there goes to the rule, before column
+    /// `ruleRight`. Returns the column after the status.
+    int drawStatus(const ui::BarItems& items, int ruleRight);
+    /// As many hints as fit after column `from`, the last ones first; of the last one, at least its
+    /// key.
+    void drawHints(const std::vector<Hint>& hints, int from);
+    void drawHint(int left, std::string_view text, const KeyEvent& key);
+
+private:
+    int drawCutInFront(int x, int y, std::string_view text);
+
+    Grid& _grid;
+    const Marks& _marks;
+    HitMap& _hits;
+    const PaneStatus& _status;
+};
+
+} // namespace pallax::terminal
