@@ -1,6 +1,8 @@
 #include "browsing/ScreenBrowser.h"
 
 #include "browsing/LinkNotes.h"
+#include "host/KnowledgeFiles.h"
+#include "host/UserFolders.h"
 #include "link/Settings.h"
 #include "platform/ZoneText.h"
 
@@ -20,7 +22,7 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                              ChildService* child, BrowsedSource source, const Settings& settings,
                              terminal::CursesTerminal& terminal, StandardOutput& notices)
     : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, notices),
-      _keys(_link.queue(), terminal.inputDescriptor()),
+      _keys(_link.queue(), terminal.inputDescriptor()), _watch(_link.resources()),
       _frontEnd(frontEndSurroundings(), terminal.marks()),
       _preferences(FilePreferences::userFolder()),
       _session(sessionSurroundings(std::move(source), settings)) {}
@@ -35,7 +37,8 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
                     needsDisplay();
                 },
             .startAfresh = [this] { _session.startAfresh(); },
-            .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); }};
+            .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); },
+            .overview = [this] { return overview(); }};
 }
 
 BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource source,
@@ -50,12 +53,15 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource s
             .present = _link.present(),
             .makeModel =
                 [this](ModelObserver& observer) {
-                    return std::make_unique<PallaxModel>(_link.platform(), observer);
+                    auto model = std::make_unique<PallaxModel>(_link.platform(), observer);
+                    model->addSampleSink(_watch);
+                    return model;
                 },
             .face = {.message = [this](const auto& text) { _frontEnd.setMessage(text); },
                      .note = [this](const auto& text) { _frontEnd.setNote(text); },
                      .origin =
                          [this](const auto& technology, const auto& name) {
+                             _watch.begin(technology);
                              _frontEnd.setOrigin({technology, name});
                          },
                      .oldValues = [this](const auto& time) { _frontEnd.setOldValues(time); }},
@@ -65,6 +71,20 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource s
             .snapshotDirectory = settings.snapshotDirectory,
             .saveButtonMarker = settings.saveButtonMarker,
             .startsAfreshByItself = settings.afterReconnect == AfterReconnect::Fresh};
+}
+
+Overview ScreenBrowser::overview() {
+    if (!_names) {
+        InstalledNames installed = readInstalledNames(dataFolders());
+        for (const std::string& complaint : installed.complaints) {
+            _frontEnd.setMessage(complaint);
+        }
+        _names = std::move(installed.names);
+    }
+    const Time now = _link.clock().now();
+    Overview overview = _watch.overview(now, *_names, *builtInProfile(kDefaultProfile));
+    overview.ahead = _link.clock().zone(now).offset;
+    return overview;
 }
 
 bool ScreenBrowser::run() {

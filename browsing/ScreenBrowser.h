@@ -3,11 +3,14 @@
 #include "app/BrowsingSession.h"
 #include "host/FilePreferences.h"
 #include "host/HostFileSystem.h"
+#include "knowledge/Networks.h"
 #include "link/BrowseLink.h"
+#include "overview/StatusWatch.h"
 #include "ui/terminal/CursesTerminal.h"
 #include "ui/terminal/FrontEnd.h"
 
 #include <memory>
+#include <optional>
 
 namespace pallax {
 
@@ -37,11 +40,14 @@ private:
     void display();
     void keepTurning();
     void adoptSize();
+    Overview overview();
 
     bool _isDisplayPosted = false;
     terminal::CursesTerminal& _terminal;
     BrowseLink _link;
     DescriptorWatch _keys;
+    StatusWatch _watch;
+    std::optional<NetworkNames> _names; ///< read when the overview is drawn for the first time
     terminal::FrontEnd _frontEnd;
     HostFileSystem _files;
     FilePreferences _preferences;

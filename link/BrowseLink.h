@@ -35,6 +35,7 @@ public:
     AsioMainQueue& queue() { return _queue; }
     SourceClock& clock() { return _clock; }
     const Clock& present() const { return _wallClock; }
+    const Resources& resources() const { return _resources; }
     ModemLink::Platform platform();
     /// See LinkPorts.
     const std::string& obstacle() const { return _linkPorts.obstacle(); }

@@ -40,16 +40,7 @@ Grid FrontEnd::draw() {
         return grid;
     }
     endFilterOfOtherPane();
-    const LineEditor* editor = _filterEditor ? &*_filterEditor : nullptr;
-    PaneView(grid, _marks, _hits)
-        .draw(*navigation, {.spinnerTurn = _spinnerTurn,
-                            .filterEditor = editor,
-                            .message = _message,
-                            .note = _note,
-                            .origin = _origin,
-                            .oldValues = _oldValues,
-                            .zone = _surroundings.zone(),
-                            .press = [this](const KeyEvent& event) { handle(event); }});
+    drawScreen(grid, *navigation);
     if (const auto& modal = navigation->modal()) {
         ModalView(grid, _marks, _hits).draw(*modal, _modalFocus);
     }
@@ -60,6 +51,33 @@ Grid FrontEnd::draw() {
         drawAlert(grid, _marks, *alert);
     }
     return grid;
+}
+
+/// The topmost pane, or the overview.
+void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
+    // First, because a message may come with it.
+    const auto overview =
+        _overview.isOpen() ? std::optional(_surroundings.overview()) : std::nullopt;
+    const PaneStatus status{.spinnerTurn = _spinnerTurn,
+                            .filterEditor = _filterEditor ? &*_filterEditor : nullptr,
+                            .message = _message,
+                            .note = _note,
+                            .origin = _origin,
+                            .oldValues = _oldValues,
+                            .zone = _surroundings.zone(),
+                            .press = [this](const KeyEvent& event) { handle(event); }};
+    if (overview) {
+        _overview.draw(
+            {grid, _marks, _hits}, *overview,
+            {navigation.screens().front()->title(), navigation.top().toolbarItems(), status});
+    } else {
+        PaneView(grid, _marks, _hits).draw(navigation, status);
+    }
+}
+
+void FrontEnd::openOverview() {
+    _overview.open();
+    needsDisplay();
 }
 
 void FrontEnd::setMessage(std::string message) {
@@ -116,6 +134,8 @@ void FrontEnd::handle(const KeyEvent& event) {
     } else if (_help.isOpen()) {
         _help.handle(event);
         needsDisplay();
+    } else if (_overview.isOpen() && event.key != Key::Click) {
+        handleOverview(event);
     } else if (event.key == Key::Click || event.key == Key::WheelUp ||
                event.key == Key::WheelDown) {
         handleMouse(event);
@@ -193,6 +213,20 @@ void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
     }
 }
 
+/// Keys that do not belong to a pane do what they do there.
+void FrontEnd::handleOverview(const KeyEvent& event) {
+    if (_overview.handle(event)) {
+        return needsDisplay();
+    }
+    const char32_t character = event.key == Key::Character ? event.character : 0;
+    if (character == U'q' && !_toolkit.navigation()->isAtRoot()) {
+        _overview.close();
+        needsDisplay();
+    } else if (character == U'q' || character == U'?' || character == U'R') {
+        handlePaneCharacter(character);
+    }
+}
+
 void FrontEnd::handleFilter(TerminalTable& table, const KeyEvent& event) {
     const bool erasesNothing = event.key == Key::Backspace && _filterEditor->text().empty();
     if (event.key == Key::Escape || erasesNothing) {
@@ -255,6 +289,8 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return pane.moveToEnd();
     case U'/':
         return startFilter(pane);
+    case U'o':
+        return openOverview();
     case U's':
         return save();
     case U'y':

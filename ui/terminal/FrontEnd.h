@@ -8,6 +8,7 @@
 #include "ui/terminal/Marks.h"
 #include "ui/terminal/ModalView.h"
 #include "ui/terminal/Origin.h"
+#include "ui/terminal/OverviewPage.h"
 #include "ui/terminal/TerminalToolkit.h"
 
 #include <functional>
@@ -31,6 +32,8 @@ public:
         std::function<void()> startAfresh = [] {};
         /// The offset of the time in the status text: "+0200".
         std::function<std::string()> zone = [] { return std::string(); };
+        /// What the overview shows now.
+        std::function<Overview()> overview = [] { return Overview(); };
     };
 
     FrontEnd(Surroundings surroundings, const Marks& marks);
@@ -41,6 +44,9 @@ public:
     void resize(int columns, int rows) { _toolkit.setSize(columns, rows); }
     void handle(const KeyEvent& event);
     Grid draw();
+
+    /// Shows the overview over the panes, as its key does.
+    void openOverview();
 
     /// Replaces the status text until the next key.
     void setMessage(std::string message);
@@ -59,9 +65,11 @@ public:
 
 private:
     void needsDisplay();
+    void drawScreen(Grid& grid, TerminalNavigation& navigation);
     void handleMouse(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
     void handleModal(ui::ModalScreen& screen, const KeyEvent& event);
+    void handleOverview(const KeyEvent& event);
     void handleFilter(TerminalTable& table, const KeyEvent& event);
     void handlePane(const KeyEvent& event);
     void handlePaneCharacter(char32_t character);
@@ -83,6 +91,7 @@ private:
     TerminalToolkit _toolkit;
     ModalFocus _modalFocus = ModalFocus::Save;
     HelpPage _help;
+    OverviewPage _overview;
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
     std::weak_ptr<ui::TableScreen> _filteredPane; ///< the pane of the filter
     std::optional<std::string> _message;

@@ -15,6 +15,7 @@ constexpr auto kKeyHelp = std::to_array<KeyHelp>({
     {"Left h Backspace", "back"},
     {"Esc", "clear the filter, or back"},
     {"/", "filter rows by name or value"},
+    {"o", "overview of the radio"},
     {"s", "save a snapshot"},
     {"y", "copy the value"},
     {"R", "reconnect, drop old values"},

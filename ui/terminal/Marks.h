@@ -16,6 +16,8 @@ struct Marks {
     std::string_view down;       ///< before the number of rows below the window
     std::string_view crumb;      ///< between the panes of a path
     std::string_view dot;        ///< between technology and source
+    std::string_view barFull;    ///< a part of a level's bar
+    std::string_view barEmpty;   ///< the rest of the bar
     std::string_view check;
     std::string_view horizontal;
     std::string_view vertical;
@@ -35,6 +37,8 @@ inline constexpr Marks kUtf8Marks{false,
                                   "↓",
                                   " › ",
                                   " · ",
+                                  "▆",
+                                  "▁",
                                   "✓",
                                   "─",
                                   "│",
@@ -53,6 +57,8 @@ inline constexpr Marks kAsciiMarks{true,
                                    "v",
                                    " > ",
                                    ", ",
+                                   "#",
+                                   ".",
                                    "x",
                                    "-",
                                    "|",

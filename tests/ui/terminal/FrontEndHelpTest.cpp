@@ -23,16 +23,16 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
     stage.type("?");
     EXPECT_EQ(stage.screen(80, 24), R"(
  Pallax › Serving Cell Measurements
- ──────────────────────────────────────────────────────────────────────────────
-▌Version      ┌ Keys ───────────────────────────────────────────┐            1
- E-ARFCN      │ Up Down  k j      one row up or down            │         1850
- Physical Cell│ PgUp PgDn         one page up or down           │          274
- Measured RSRP│ Home End  g G     first or last row             │   -94.75 dBm
- Average RSRP │ Enter Right l     open the row                  │   -95.00 dBm
- Measured RSRQ│ Right Left  l h   scroll a long row             │     -9.50 dB
-              │ Left h Backspace  back                          │
+ ─────────────┌ Keys ───────────────────────────────────────────┐──────────────
+▌Version      │ Up Down  k j      one row up or down            │            1
+ E-ARFCN      │ PgUp PgDn         one page up or down           │         1850
+ Physical Cell│ Home End  g G     first or last row             │          274
+ Measured RSRP│ Enter Right l     open the row                  │   -94.75 dBm
+ Average RSRP │ Right Left  l h   scroll a long row             │   -95.00 dBm
+ Measured RSRQ│ Left h Backspace  back                          │     -9.50 dB
               │ Esc               clear the filter, or back     │
               │ /                 filter rows by name or value  │
+              │ o                 overview of the radio         │
               │ s                 save a snapshot               │
               │ y                 copy the value                │
               │ R                 reconnect, drop old values    │
@@ -202,7 +202,7 @@ TEST_F(FrontEndHelpTest, EveryKeyIsNamed) {
     for (const char* key :
          {"Up",        "Down", "PgUp", "PgDn", "Home", "End",    "Enter",  "Right", "Left",
           "Backspace", "Esc",  "h",    "j",    "k",    "l",      "g",      "G",     "/",
-          "s",         "y",    "R",    "?",    "q",    "Ctrl-L", "Ctrl-Z", "Tab"}) {
+          "o",         "s",    "y",    "R",    "?",    "q",    "Ctrl-L", "Ctrl-Z", "Tab"}) {
         EXPECT_NE(std::find(names.begin(), names.end(), key), names.end()) << key;
     }
 }

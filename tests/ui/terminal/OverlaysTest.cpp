@@ -107,6 +107,7 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ Left h Backspace  back                          │
 │ Esc               clear the filter, or back     │
 │ /                 filter rows by name or value  │
+│ o                 overview of the radio         │
 │ s                 save a snapshot               │
 │ y                 copy the value                │
 │ R                 reconnect, drop old values    │

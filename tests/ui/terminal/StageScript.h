@@ -18,6 +18,7 @@ class StageScript {
 public:
     explicit StageScript(std::span<const std::uint8_t> bytes) : _bytes(bytes) {
         _stage.saveHistory = snapshotItems();
+        _stage.overview = anOverview();
         _stage.frontEnd.resize(kMostColumns / 2, kMostRows / 2);
     }
 
@@ -105,6 +106,25 @@ private:
         default:
             return;
         }
+    }
+
+    /// More than most of the screens can show.
+    static Overview anOverview() {
+        constexpr int kMany = 20;
+        Overview overview;
+        overview.status.cells = {{"LTE",
+                                  "漢字\x1b",
+                                  {{"PCI", "", "\xff", 0, {}, {}}},
+                                  {},
+                                  "",
+                                  {},
+                                  {{"RSRP", "", "-92.25 dBm", 0, {}, {}}}}};
+        for (int index = 0; index < kMany; ++index) {
+            overview.status.neighbours.push_back(
+                {"LTE", "PCI " + std::to_string(index), {"RSRP", "", "e\u0301", 0, {}, {}}});
+            overview.events.push_back({EventKind::CellChange, {}, 1, "漢字 → \u009b", {}});
+        }
+        return overview;
     }
 
     /// Displays of several kinds, whose panes share names.

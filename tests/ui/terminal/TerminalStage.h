@@ -25,7 +25,8 @@ public:
     explicit TerminalStage(const Marks& marks = kUtf8Marks)
         : frontEnd({[this] { ++displays; }, [this] { ++quits; },
                     [this](const std::string& text) { copied.push_back(text); },
-                    [this] { ++repaints; }, [this] { ++startsAfresh; }, [this] { return zone; }},
+                    [this] { ++repaints; }, [this] { ++startsAfresh; }, [this] { return zone; },
+                    [this] { return overview; }},
                    marks),
           _window(frontEnd.toolkit().makeWindow({})) {
         auto root = std::make_shared<PallaxPaneController>(frontEnd.toolkit(), *this, nullptr, "/");
@@ -43,6 +44,7 @@ public:
     int startsAfresh = 0;
     std::string zone; ///< of the status text's time
     std::vector<std::string> copied;
+    Overview overview; ///< what the overview shows
 
     bool savingAllowed = true;
     std::optional<std::string> status; ///< null: follows the connection
