@@ -25,7 +25,11 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
       _keys(_link.queue(), terminal.inputDescriptor()), _watch(_link.resources()),
       _frontEnd(frontEndSurroundings(), terminal.marks()),
       _preferences(FilePreferences::userFolder()),
-      _session(sessionSurroundings(std::move(source), settings)) {}
+      _session(sessionSurroundings(std::move(source), settings)) {
+    if (settings.firstScreen == FirstScreen::Overview) {
+        _frontEnd.openOverview();
+    }
+}
 
 terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
     return {.needsDisplay = [this] { needsDisplay(); },

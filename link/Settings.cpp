@@ -42,6 +42,41 @@ constexpr std::array kNumberSettings{
                   }},
 };
 
+/// A setting whose value is one of two words; the first one is the default.
+struct ChoiceSetting {
+    std::string_view key;
+    std::string_view usual;
+    std::string_view other;
+    void (*set)(Settings& settings, bool isOther);
+};
+
+constexpr std::array kChoiceSettings{
+    ChoiceSetting{"on-fatal-record", "stop", "skip",
+                  [](Settings& settings, bool isSkip) {
+                      settings.onFatalRecord = isSkip ? OnFatalRecord::Skip : OnFatalRecord::Stop;
+                  }},
+    ChoiceSetting{"after-reconnect", "keep", "fresh",
+                  [](Settings& settings, bool isFresh) {
+                      settings.afterReconnect =
+                          isFresh ? AfterReconnect::Fresh : AfterReconnect::Keep;
+                  }},
+    ChoiceSetting{"first-screen", "panes", "overview",
+                  [](Settings& settings, bool isOverview) {
+                      settings.firstScreen =
+                          isOverview ? FirstScreen::Overview : FirstScreen::Panes;
+                  }},
+};
+
+std::optional<std::string> takeChoice(Settings& settings, const ChoiceSetting& setting,
+                                      std::string_view text) {
+    if (text != setting.usual && text != setting.other) {
+        return formatText("%@ is \"%@\" or \"%@\", not \"%@\"",
+                          {setting.key, setting.usual, setting.other, text});
+    }
+    setting.set(settings, text == setting.other);
+    return std::nullopt;
+}
+
 std::optional<std::string> takeNumber(Settings& settings, const NumberSetting& setting,
                                       std::string_view text) {
     int number = 0;
@@ -57,24 +92,15 @@ std::optional<std::string> takeNumber(Settings& settings, const NumberSetting& s
 
 /// Sets one setting; returns the reason if it cannot.
 std::optional<std::string> take(Settings& settings, std::string_view key, std::string_view value) {
-    if (key == "on-fatal-record") {
-        if (value != "stop" && value != "skip") {
-            return formatText("on-fatal-record is \"stop\" or \"skip\", not \"%@\"", {value});
+    for (const ChoiceSetting& setting : kChoiceSettings) {
+        if (key == setting.key) {
+            return takeChoice(settings, setting, value);
         }
-        settings.onFatalRecord = value == "skip" ? OnFatalRecord::Skip : OnFatalRecord::Stop;
-        return std::nullopt;
     }
     for (const NumberSetting& setting : kNumberSettings) {
         if (key == setting.key) {
             return takeNumber(settings, setting, value);
         }
-    }
-    if (key == "after-reconnect") {
-        if (value != "keep" && value != "fresh") {
-            return formatText("after-reconnect is \"keep\" or \"fresh\", not \"%@\"", {value});
-        }
-        settings.afterReconnect = value == "fresh" ? AfterReconnect::Fresh : AfterReconnect::Keep;
-        return std::nullopt;
     }
     if (key != "snapshot-directory" && key != "save-button-marker") {
         return formatText("there is no setting \"%@\"", {key});

@@ -16,11 +16,15 @@ namespace pallax {
 /// The fate of the display after a restart of the link to the modem.
 enum class AfterReconnect { Keep, Fresh };
 
+/// The screen that a viewer opens with.
+enum class FirstScreen { Panes, Overview };
+
 /// The contents of the settings file; without one, the defaults. Lines are `key = value`, empty, or
 /// a comment from "#" on its own line.
 struct Settings {
     AfterReconnect afterReconnect = AfterReconnect::Keep; ///< after-reconnect = keep | fresh
     OnFatalRecord onFatalRecord = OnFatalRecord::Stop;    ///< on-fatal-record = stop | skip
+    FirstScreen firstScreen = FirstScreen::Panes;         ///< first-screen = panes | overview
     std::optional<std::string> snapshotDirectory;         ///< snapshot-directory = PATH
     std::optional<std::string> saveButtonMarker;          ///< save-button-marker = PATH
     int systemLogLevel = kSyslogLevel;                    ///< system-log-level = 0 ... 7

@@ -25,6 +25,7 @@ TEST(Settings, AreReadLineByLine) {
                                         "snapshot-directory=/tmp/a = b\n"
                                         "system-log-level = 4\n"
                                         "after-reconnect = fresh\n"
+                                        "first-screen = overview\n"
                                         "journal-hours = 2\n"
                                         "journal-mebibytes = 65536\n"
                                         "save-button-marker = /tmp/marker",
@@ -35,10 +36,13 @@ TEST(Settings, AreReadLineByLine) {
     EXPECT_EQ(settings->saveButtonMarker, "/tmp/marker");
     EXPECT_EQ(settings->systemLogLevel, 4);
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Fresh);
+    EXPECT_EQ(settings->firstScreen, FirstScreen::Overview);
     EXPECT_EQ(settings->journal.age, std::chrono::hours(2));
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{64} << 30U);
     EXPECT_EQ(parseSettings("after-reconnect = keep", "pallax.conf")->afterReconnect,
               AfterReconnect::Keep);
+    EXPECT_EQ(parseSettings("first-screen = panes", "pallax.conf")->firstScreen,
+              FirstScreen::Panes);
 }
 
 TEST(Settings, WithoutAFileTheDefaultsHold) {
@@ -49,6 +53,7 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
     EXPECT_EQ(settings->saveButtonMarker, std::nullopt);
     EXPECT_EQ(settings->systemLogLevel, 3);
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Keep);
+    EXPECT_EQ(settings->firstScreen, FirstScreen::Panes);
     EXPECT_EQ(settings->journal.age, std::chrono::hours(24));
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{256} << 20U);
 }
@@ -60,6 +65,8 @@ TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
               "pallax.conf, line 1: on-fatal-record is \"stop\" or \"skip\", not \"maybe\".");
     EXPECT_EQ(sentenceFor("after-reconnect = never"),
               "pallax.conf, line 1: after-reconnect is \"keep\" or \"fresh\", not \"never\".");
+    EXPECT_EQ(sentenceFor("first-screen = graph"),
+              "pallax.conf, line 1: first-screen is \"panes\" or \"overview\", not \"graph\".");
     EXPECT_EQ(sentenceFor("snapshot-directory ="),
               "pallax.conf, line 1: snapshot-directory needs a path.");
     for (const char* level : {"8", "-1", "4x", "", "warning", "99999999999"}) {
