@@ -200,9 +200,9 @@ std::vector<std::string> namedKeys() {
 TEST_F(FrontEndHelpTest, EveryKeyIsNamed) {
     const std::vector<std::string> names = namedKeys();
     for (const char* key :
-         {"Up",        "Down", "PgUp", "PgDn", "Home", "End",    "Enter",  "Right", "Left",
-          "Backspace", "Esc",  "h",    "j",    "k",    "l",      "g",      "G",     "/",
-          "o",         "s",    "y",    "R",    "?",    "q",    "Ctrl-L", "Ctrl-Z", "Tab"}) {
+         {"Up",        "Down", "PgUp", "PgDn", "Home", "End", "Enter",  "Right",  "Left",
+          "Backspace", "Esc",  "h",    "j",    "k",    "l",   "g",      "G",      "/",
+          "o",         "s",    "y",    "R",    "?",    "q",   "Ctrl-L", "Ctrl-Z", "Tab"}) {
         EXPECT_NE(std::find(names.begin(), names.end(), key), names.end()) << key;
     }
 }
