@@ -213,7 +213,7 @@ void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
     }
 }
 
-/// Keys that do not belong to a pane do what they do there.
+/// The keys for help, a fresh start and quitting work as in a pane.
 void FrontEnd::handleOverview(const KeyEvent& event) {
     if (_overview.handle(event)) {
         return needsDisplay();

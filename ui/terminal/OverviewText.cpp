@@ -35,7 +35,7 @@ struct Block {
     bool namesItself = false;                         ///< its rows can do without its name
 };
 
-/// Makes blocks of an overview that are so many columns wide.
+/// Makes the blocks of an overview, with rows of at most `columns` columns.
 class Blocks {
 public:
     Blocks(const Overview& overview, const Marks& marks, int columns)
@@ -85,8 +85,8 @@ std::vector<TextRow> Blocks::wrapped(const std::vector<std::string>& words) cons
     return rows;
 }
 
-/// Rows of cells, the columns of which are equally wide. What does not fit is left out from the
-/// end.
+/// Rows of cells with aligned columns. Columns that do not fit are left out, starting with the
+/// last.
 std::vector<TextRow> Blocks::table(std::vector<std::vector<TableText>> rows) const {
     std::vector<int> widths;
     for (const auto& row : rows) {
@@ -254,7 +254,7 @@ public:
             _blocks.push_back(std::move(block));
         }
     }
-    /// Shortens lists, the last one first, to fit into so many rows.
+    /// At most `most` rows if lists can be shortened so far, the last list first.
     std::vector<TextRow> rows(std::size_t most) &&;
 
 private:
