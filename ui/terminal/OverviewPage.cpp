@@ -9,7 +9,7 @@ namespace pallax::terminal {
 
 namespace {
 
-constexpr std::string_view kTitle = "Overview";
+constexpr std::string_view kOverviewTitle = "Overview";
 constexpr std::string_view kNothing = "Nothing is known about the radio.";
 constexpr Style kBoldTitle{.bold = true};
 
@@ -54,7 +54,8 @@ void OverviewPage::draw(const Screen& screen, const Overview& overview, const Ar
     Grid& grid = screen.grid;
     Bars bars(grid, screen.marks, screen.hits, around.status);
     const int end = grid.columns() - kMargin;
-    const std::string title = std::string(around.root).append(screen.marks.crumb).append(kTitle);
+    const std::string title =
+        std::string(around.root).append(screen.marks.crumb).append(kOverviewTitle);
     const int room = bars.drawOrigin(end, end - kMargin - columnsOf(title) - kGap);
     grid.put(kMargin, kTitleRow, title, kBoldTitle, {kMargin, room});
 
