@@ -47,7 +47,7 @@ class Query {
 public:
     /// The names of the columns.
     const std::vector<std::string>& columns() const { return _columns; }
-    /// The columns of the table that the query reads, in no particular order, each once.
+    /// The columns of the table that the query reads, sorted, each once.
     std::vector<std::string> columnsRead(std::string_view table) const;
     /// The next row; nothing after the last.
     Result<std::optional<std::vector<QueryValue>>, QueryError> next();

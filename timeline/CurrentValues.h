@@ -112,7 +112,8 @@ private:
     /// A list that has begun but not ended.
     struct Open {
         std::size_t list = 0;
-        Slot* slot = nullptr; ///< of the entry, while it is open: looked for only once
+        /// Of the entry. It does not move while the entry is open: its list gets no other entry.
+        Slot* slot = nullptr;
         EntryId outer = kNoEntry;
         std::size_t index = 0; ///< of the entry, as the sink gets it
         std::int64_t name = 0;
