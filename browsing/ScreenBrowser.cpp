@@ -81,7 +81,8 @@ Overview ScreenBrowser::overview() {
     if (!_names) {
         InstalledNames installed = readInstalledNames(dataFolders());
         for (const std::string& complaint : installed.complaints) {
-            _frontEnd.setMessage(complaint);
+            // Not while the screen is being drawn.
+            _link.queue().async([this, complaint] { _frontEnd.setMessage(complaint); });
         }
         _names = std::move(installed.names);
     }

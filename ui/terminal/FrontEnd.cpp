@@ -53,11 +53,8 @@ Grid FrontEnd::draw() {
     return grid;
 }
 
-/// The topmost pane, or the overview.
+/// The topmost pane, or the page over it.
 void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
-    // First, because a message may come with it.
-    const auto overview =
-        _overview.isOpen() ? std::optional(_surroundings.overview()) : std::nullopt;
     const PaneStatus status{.spinnerTurn = _spinnerTurn,
                             .filterEditor = _filterEditor ? &*_filterEditor : nullptr,
                             .message = _message,
@@ -66,17 +63,16 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .oldValues = _oldValues,
                             .zone = _surroundings.zone(),
                             .press = [this](const KeyEvent& event) { handle(event); }};
-    if (overview) {
-        _overview.draw(
-            {grid, _marks, _hits}, *overview,
-            {navigation.screens().front()->title(), navigation.top().toolbarItems(), status});
+    if (_pages.isOpen()) {
+        _pages.draw({grid, _marks, _hits}, {navigation.screens().front()->title(),
+                                            navigation.top().toolbarItems(), status});
     } else {
         PaneView(grid, _marks, _hits).draw(navigation, status);
     }
 }
 
 void FrontEnd::openOverview() {
-    _overview.open();
+    _pages.open(OverviewPage(_surroundings.overview));
     needsDisplay();
 }
 
@@ -134,8 +130,8 @@ void FrontEnd::handle(const KeyEvent& event) {
     } else if (_help.isOpen()) {
         _help.handle(event);
         needsDisplay();
-    } else if (_overview.isOpen() && event.key != Key::Click) {
-        handleOverview(event);
+    } else if (_pages.isOpen() && event.key != Key::Click) {
+        handlePage(event);
     } else if (event.key == Key::Click || event.key == Key::WheelUp ||
                event.key == Key::WheelDown) {
         handleMouse(event);
@@ -214,13 +210,13 @@ void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
 }
 
 /// The keys for help, a fresh start and quitting work as in a pane.
-void FrontEnd::handleOverview(const KeyEvent& event) {
-    if (_overview.handle(event)) {
+void FrontEnd::handlePage(const KeyEvent& event) {
+    if (_pages.handle(event) != PageAnswer::NotMine) {
         return needsDisplay();
     }
     const char32_t character = event.key == Key::Character ? event.character : 0;
     if (character == U'q' && !_toolkit.navigation()->isAtRoot()) {
-        _overview.close();
+        _pages.closeTop();
         needsDisplay();
     } else if (character == U'q' || character == U'?' || character == U'R') {
         handlePaneCharacter(character);

@@ -8,7 +8,7 @@
 #include "ui/terminal/Marks.h"
 #include "ui/terminal/ModalView.h"
 #include "ui/terminal/Origin.h"
-#include "ui/terminal/OverviewPage.h"
+#include "ui/terminal/Pages.h"
 #include "ui/terminal/TerminalToolkit.h"
 
 #include <functional>
@@ -69,7 +69,7 @@ private:
     void handleMouse(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
     void handleModal(ui::ModalScreen& screen, const KeyEvent& event);
-    void handleOverview(const KeyEvent& event);
+    void handlePage(const KeyEvent& event);
     void handleFilter(TerminalTable& table, const KeyEvent& event);
     void handlePane(const KeyEvent& event);
     void handlePaneCharacter(char32_t character);
@@ -91,7 +91,7 @@ private:
     TerminalToolkit _toolkit;
     ModalFocus _modalFocus = ModalFocus::Save;
     HelpPage _help;
-    OverviewPage _overview;
+    Pages _pages;
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
     std::weak_ptr<ui::TableScreen> _filteredPane; ///< the pane of the filter
     std::optional<std::string> _message;

@@ -13,17 +13,6 @@ constexpr std::string_view kOverviewTitle = "Overview";
 constexpr std::string_view kNothing = "Nothing is known about the radio.";
 constexpr Style kBoldTitle{.bold = true};
 
-bool closes(const KeyEvent& event) {
-    switch (event.key) {
-    case Key::Escape:
-    case Key::Left:
-    case Key::Backspace:
-        return true;
-    default:
-        return event.key == Key::Character && (event.character == U'o' || event.character == U'h');
-    }
-}
-
 /// A row that does not fit ends in a mark.
 void drawRow(Grid& grid, const Marks& marks, const TextRow& row, Span span, int y) {
     int x = span.left;
@@ -37,20 +26,16 @@ void drawRow(Grid& grid, const Marks& marks, const TextRow& row, Span span, int 
 
 } // namespace
 
-void OverviewPage::open() {
-    _isOpen = true;
-    _scrolling = {};
-}
-
-bool OverviewPage::handle(const KeyEvent& event) {
-    if (closes(event)) {
-        _isOpen = false;
-        return true;
+PageAnswer OverviewPage::handle(const KeyEvent& event) {
+    const bool closes = event.key == Key::Character && event.character == U'o';
+    if (closes || goesBack(event)) {
+        return PageAnswer::Closes;
     }
-    return _scrolling.handle(event);
+    return _scrolling.handle(event) ? PageAnswer::Handled : PageAnswer::NotMine;
 }
 
-void OverviewPage::draw(const Screen& screen, const Overview& overview, const Around& around) {
+void OverviewPage::draw(const PageScreen& screen, const PageSurroundings& around) {
+    const Overview overview = _source();
     Grid& grid = screen.grid;
     Bars bars(grid, screen.marks, screen.hits, around.status);
     const int end = grid.columns() - kMargin;

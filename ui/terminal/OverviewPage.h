@@ -1,37 +1,27 @@
 #pragma once
 
-#include "ui/terminal/Bars.h"
 #include "ui/terminal/OverviewText.h"
+#include "ui/terminal/Page.h"
 #include "ui/terminal/Scrolling.h"
 
-#include <string_view>
+#include <functional>
+#include <utility>
 
 namespace pallax::terminal {
 
-/// The overview: a screen over the panes, which are updated while it is open.
+/// What is known about the radio, on one page.
 class OverviewPage {
 public:
-    struct Screen {
-        Grid& grid;
-        const Marks& marks;
-        HitMap& hits;
-    };
-    /// What is shown around the overview.
-    struct Around {
-        std::string_view root; ///< the first pane's title
-        const ui::BarItems& items;
-        const PaneStatus& status;
-    };
+    /// Returns what is known now.
+    using Source = std::function<Overview()>;
 
-    bool isOpen() const { return _isOpen; }
-    void open();
-    void close() { _isOpen = false; }
-    /// Closes the page or scrolls it; false for a key that does neither.
-    bool handle(const KeyEvent& event);
-    void draw(const Screen& screen, const Overview& overview, const Around& around);
+    explicit OverviewPage(Source source) : _source(std::move(source)) {}
+
+    PageAnswer handle(const KeyEvent& event);
+    void draw(const PageScreen& screen, const PageSurroundings& around);
 
 private:
-    bool _isOpen = false;
+    Source _source;
     Scrolling _scrolling;
 };
 
