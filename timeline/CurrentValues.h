@@ -68,6 +68,8 @@ public:
     const FieldValue* value(std::string_view fieldName) const;
     const FieldTable& fields() const { return *_fields; }
     const EntryTable& entries() const { return *_entries; }
+    /// The time of the latest packet.
+    Time time() const { return _time; }
     std::size_t fieldCount() const { return _values.size(); }
     /// Calls `visit` with each entry (EntryValues) of each list, in the order of the lists.
     template <class Visit>

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/SectionAges.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace pallax {
@@ -62,12 +63,76 @@ const TimelineKeyFrame* startOf(const Timeline& timeline, const Stretch& stretch
     return start;
 }
 
-FrameRef frameOf(Replay& replay, const ShownTick& tick, const FrameRef& before) {
+FrameRef frameOf(Replay& replay, Time time, const FrameRef& before) {
     const auto paths = std::make_shared<PathDictionary>();
-    NodeRef root = PallaxModelNode::makeTreeFromObject(replay.displayAt(tick.tick.time), *paths);
+    NodeRef root = PallaxModelNode::makeTreeFromObject(replay.displayAt(time), *paths);
     const SectionAges ages = replay.ages();
-    return std::make_shared<Frame>(Frame::Picture{std::move(root), paths, tick.tick.time},
-                                   before.get(), &ages);
+    return std::make_shared<Frame>(Frame::Picture{std::move(root), paths, time}, before.get(),
+                                   &ages);
+}
+
+/// The replay at a later instant: decodes on, or from a key frame in between.
+std::unique_ptr<Replay> laterReplay(Timeline& timeline, std::unique_ptr<Replay> replay,
+                                    std::uint64_t instant) {
+    const TimelineKeyFrame* nearest = timeline.keyFrames().atOrBefore(instant);
+    if (nearest != nullptr && nearest->packet > replay->packet()) {
+        return timeline.replayAt(instant);
+    }
+    timeline.advance(*replay, instant);
+    return replay;
+}
+
+/// The frames of an instant and of the tick before it, if any.
+InstantFrame framesOf(Timeline& timeline, const std::optional<ShownTick>& before,
+                      std::uint64_t instant, Time time) {
+    InstantFrame made;
+    std::unique_ptr<Replay> replay;
+    if (before) {
+        replay = timeline.replayAt(before->packet);
+        made.before = frameOf(*replay, before->tick.time, nullptr);
+        replay = laterReplay(timeline, std::move(replay), instant);
+    } else {
+        replay = timeline.replayAt(instant);
+    }
+    made.frame = frameOf(*replay, time, made.before);
+    return made;
+}
+
+/// Calls `visit` (ShownTick -> whether to continue) with the two latest ticks of a key frame and
+/// with those after it.
+template <class Visit>
+void forEachTick(Timeline& timeline, const TimelineKeyFrame& from, const Visit& visit) {
+    for (const ShownTick& tick : from.ticks) {
+        if (!visit(tick)) {
+            return;
+        }
+    }
+    TickGrid grid = from.grid;
+    std::uint64_t latest = from.packet;
+    const auto reader = timeline.journal().reader(from.packet + 1);
+    while (latest < timeline.packets()) {
+        const auto packet = reader->next();
+        if (!packet) {
+            break;
+        }
+        const auto tick = grid.passedBefore(packet->time);
+        if (tick && !visit(ShownTick{*tick, packet->number - 1})) {
+            return;
+        }
+        latest = packet->number;
+    }
+    if (latest > from.packet) {
+        (void)visit(ShownTick{grid.next(), latest});
+    }
+}
+
+/// The stretch of an instant; null before the first packet.
+const Stretch* stretchOfInstant(const Timeline& timeline, std::uint64_t instant) {
+    const auto& stretches = timeline.stretches();
+    const auto past = std::upper_bound(
+        stretches.begin(), stretches.end(), instant,
+        [](std::uint64_t at, const Stretch& stretch) { return at < stretch.firstPacket; });
+    return past == stretches.begin() ? nullptr : &*(past - 1);
 }
 
 } // namespace
@@ -101,20 +166,68 @@ std::optional<TickFrame> frameAt(Timeline& timeline, Time time) {
     if (ticks.empty() || ticks.front().packet < timeline.firstInstant()) {
         return std::nullopt;
     }
-    std::unique_ptr<Replay> replay = timeline.replayAt(ticks.front().packet);
-    TickFrame made{frameOf(*replay, ticks.front(), nullptr), nullptr, ticks.back().tick,
-                   ticks.back().packet};
-    if (ticks.size() == 2) {
-        const TimelineKeyFrame* nearest = timeline.keyFrames().atOrBefore(ticks.back().packet);
-        if (nearest != nullptr && nearest->packet > replay->packet()) {
-            replay = timeline.replayAt(ticks.back().packet);
-        } else {
-            timeline.advance(*replay, ticks.back().packet);
-        }
-        made.before = std::exchange(made.frame, nullptr);
-        made.frame = frameOf(*replay, ticks.back(), made.before);
+    const ShownTick& last = ticks.back();
+    InstantFrame made =
+        framesOf(timeline, ticks.size() == 2 ? std::optional(ticks.front()) : std::nullopt,
+                 last.packet, last.tick.time);
+    return TickFrame{std::move(made.frame), std::move(made.before), last.tick, last.packet};
+}
+
+std::optional<InstantFrame> frameAtInstant(Timeline& timeline, std::uint64_t instant) {
+    const std::optional<Time> time = timeOf(timeline, instant);
+    if (!time || instant == 0) {
+        return std::nullopt;
     }
-    return made;
+    return framesOf(timeline, tickBefore(timeline, instant), instant, *time);
+}
+
+std::optional<Time> timeOf(Timeline& timeline, std::uint64_t instant) {
+    const auto packet = timeline.journal().reader(std::max<std::uint64_t>(instant, 1))->next();
+    return packet ? std::optional(packet->time) : std::nullopt;
+}
+
+std::uint64_t instantBeside(Timeline& timeline, std::uint64_t instant, Time time) {
+    const std::uint64_t first = timeline.firstInstant();
+    const Stretch* stretch = stretchOfInstant(timeline, instant);
+    if (stretch == nullptr) {
+        return instant;
+    }
+    if (time < stretch->first) {
+        return std::max(stretch->firstPacket - 1, first);
+    }
+    if (time > stretch->latest && stretch != &timeline.stretches().back()) {
+        return std::max((stretch + 1)->firstPacket, first);
+    }
+    return std::max(timeline.instantIn(*stretch, time), first);
+}
+
+std::optional<ShownTick> tickBefore(Timeline& timeline, std::uint64_t instant) {
+    std::optional<ShownTick> found;
+    const TimelineKeyFrame* from =
+        instant == 0 ? nullptr : timeline.keyFrames().atOrBefore(instant - 1);
+    if (from != nullptr) {
+        forEachTick(timeline, *from, [&](const ShownTick& tick) {
+            const bool isBefore = tick.packet < instant;
+            if (isBefore && tick.packet >= timeline.firstInstant()) {
+                found = tick;
+            }
+            return isBefore;
+        });
+    }
+    return found;
+}
+
+std::optional<ShownTick> tickAfter(Timeline& timeline, std::uint64_t instant) {
+    std::optional<ShownTick> found;
+    if (const TimelineKeyFrame* from = timeline.keyFrames().atOrBefore(instant)) {
+        forEachTick(timeline, *from, [&](const ShownTick& tick) {
+            if (tick.packet > instant) {
+                found = tick;
+            }
+            return !found;
+        });
+    }
+    return found;
 }
 
 } // namespace pallax

@@ -22,6 +22,28 @@ struct TickFrame {
 /// not worked out.
 std::optional<TickFrame> frameAt(Timeline& timeline, Time time);
 
+/// An instant's display, made again.
+struct InstantFrame {
+    FrameRef frame;
+    FrameRef before; ///< of the latest tick before the instant; null if there is none
+};
+
+/// The display at an instant, between the earliest and the latest, with the ages at its time.
+/// Nothing before the first packet.
+std::optional<InstantFrame> frameAtInstant(Timeline& timeline, std::uint64_t instant);
+
+/// The time of an instant: the stamp of its packet, or that of the first packet before it. Nothing
+/// if the journal does not have it.
+std::optional<Time> timeOf(Timeline& timeline, std::uint64_t instant);
+/// The instant of a time in the stretch of another instant, limited to that stretch; one beyond its
+/// first or last time is in the stretch next to it, if there is one.
+std::uint64_t instantBeside(Timeline& timeline, std::uint64_t instant, Time time);
+
+/// The latest tick with new data whose packets are all before an instant, or the earliest one that
+/// has packets after it. Nothing if there is none; the ticks before the earliest instant are gone.
+std::optional<ShownTick> tickBefore(Timeline& timeline, std::uint64_t instant);
+std::optional<ShownTick> tickAfter(Timeline& timeline, std::uint64_t instant);
+
 /// The ticks with new data around a time, as `frameAt` finds them: the one before, if any, and the
 /// tick itself. Empty before the first tick.
 std::vector<ShownTick> ticksAt(Timeline& timeline, Time time);

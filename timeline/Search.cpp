@@ -11,7 +11,7 @@ class RisingEdges {
 public:
     RisingEdges(Timeline& timeline, std::uint64_t from, const ValueTest& test)
         : _timeline(timeline), _test(test), _values(timeline.valuesAt(from)), _at(from),
-          _was(test(_values)) {}
+          _was(test(_values, from)) {}
 
     /// Calls `found` (std::uint64_t -> whether to continue) with each instant up to `to`.
     template <class Found, class Continue>
@@ -30,7 +30,7 @@ public:
 private:
     template <class Found>
     bool look(std::uint64_t packet, const Found& found) {
-        const bool is = _test(_values);
+        const bool is = _test(_values, packet);
         const bool becomes = is && !_was;
         _was = is;
         return !becomes || found(packet);

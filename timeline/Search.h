@@ -8,8 +8,8 @@
 
 namespace pallax {
 
-/// Whether the current values are as they are looked for.
-using ValueTest = std::function<bool(const CurrentValues& values)>;
+/// Whether the current values after a packet are as they are looked for.
+using ValueTest = std::function<bool(const CurrentValues& values, std::uint64_t packet)>;
 /// Gets the share of the search that is done, from 0 to 1; false stops it.
 using SearchProgress = std::function<bool(double share)>;
 

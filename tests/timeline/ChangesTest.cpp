@@ -78,7 +78,7 @@ protected:
         }
         timeline = fixture.indexed(TimelineFixture::closeKeyFrames(3));
     }
-    static bool isTwo(const CurrentValues& values) {
+    static bool isTwo(const CurrentValues& values, std::uint64_t /*packet*/) {
         const FieldValue* pci = values.value("lte.serving_cell_info.physical_cell_id");
         return pci != nullptr && pci->number == 2;
     }
@@ -118,7 +118,7 @@ TEST_F(SearchTest, CanBeStopped) {
         return ++told < 2;
     };
     EXPECT_FALSE(nextInstant(
-        *whole, 0, [](const CurrentValues&) { return false; }, stop));
+        *whole, 0, [](const CurrentValues&, std::uint64_t) { return false; }, stop));
     EXPECT_EQ(told, 2);
 }
 
@@ -128,7 +128,10 @@ TEST(Search, AgreesWithLookingAtEveryInstant) {
         fixture.drive(any::bits(), 20s, 20);
         const auto timeline = fixture.indexed(
             TimelineFixture::closeKeyFrames(static_cast<std::uint64_t>(any::between(1, 90))));
-        const auto test = [](const CurrentValues& values) {
+        const auto test = [&](const CurrentValues& values, std::uint64_t packet) {
+            if (packet != 0) {
+                RC_ASSERT(values.time() == fixture.journal.packet(packet).time);
+            }
             const FieldValue* level = values.value("utran.serving_cell_info.cell_scrambling_code");
             std::size_t entries = 0;
             values.forEachEntry([&entries](const EntryValues& /*entry*/) { ++entries; });
@@ -137,10 +140,10 @@ TEST(Search, AgreesWithLookingAtEveryInstant) {
         std::vector<std::uint64_t> rising;
         CurrentValues values(timeline->fieldTable(), timeline->entryTable());
         Replay replay(fixture.source());
-        bool was = test(values);
+        bool was = test(values, 0);
         for (std::uint64_t number = 1; number <= fixture.journal.size(); ++number) {
             replay.update(fixture.journal.packet(number), &values);
-            const bool is = test(values);
+            const bool is = test(values, number);
             if (is && !was) {
                 rising.push_back(number);
             }

@@ -136,6 +136,78 @@ TEST_P(InstantsTest, TicksAfterAClockThatStepsBackAreFound) {
     EXPECT_GT(inSecond, 5U);
 }
 
+/// The ticks of all packets, and the last packet before each.
+std::vector<ShownTick> plainTicks(const MemoryJournal& journal) {
+    std::vector<ShownTick> ticks;
+    TickGrid grid;
+    for (std::uint64_t number = 1; number <= journal.size(); ++number) {
+        if (const auto tick = grid.passedBefore(journal.packet(number).time)) {
+            ticks.push_back({*tick, number - 1});
+        }
+    }
+    ticks.push_back({grid.next(), journal.size()});
+    return ticks;
+}
+
+TEST_P(InstantsTest, TheTicksBesideAnInstantAreFoundWithoutDecodingAll) {
+    EXPECT_TRUE(doubles::holds([] {
+        TimelineFixture fixture(GetParam());
+        fixture.drive(any::bits(), std::chrono::seconds(any::between(1, 20)), 10);
+        if (any::boolean()) { // the clock is set back
+            fixture.drive(any::bits(), std::chrono::seconds(any::between(3, 20)), 10);
+        }
+        const std::vector<ShownTick> ticks = plainTicks(fixture.journal);
+        const auto timeline = fixture.indexed(
+            TimelineFixture::closeKeyFrames(static_cast<std::uint64_t>(any::between(1, 60))));
+        const std::uint64_t instant = any::index(fixture.journal.size() + 1);
+        std::optional<ShownTick> before;
+        std::optional<ShownTick> after;
+        for (const ShownTick& tick : ticks) {
+            before = tick.packet < instant ? tick : before;
+            after = tick.packet > instant && !after ? tick : after;
+        }
+        const auto same = [](const auto& found, const auto& expected) {
+            return found.has_value() == expected.has_value() &&
+                   (!found || (found->packet == expected->packet &&
+                               found->tick.number == expected->tick.number &&
+                               found->tick.time == expected->tick.time));
+        };
+        RC_ASSERT(same(tickBefore(*timeline, instant), before));
+        RC_ASSERT(same(tickAfter(*timeline, instant), after));
+        const auto frame = frameAtInstant(*timeline, instant);
+        RC_ASSERT(frame.has_value() == (instant != 0));
+        if (frame) {
+            RC_ASSERT(ShownTicks::treeText(timeline->displayAt(instant)) ==
+                      treeText(*frame->frame));
+            RC_ASSERT(frame->frame->time() == fixture.journal.packet(instant).time);
+            RC_ASSERT((frame->before != nullptr) == before.has_value());
+            if (before) {
+                RC_ASSERT(ShownTicks::treeText(timeline->displayAt(before->packet)) ==
+                          treeText(*frame->before));
+            }
+        }
+    }));
+}
+
+TEST(Instants, ATimeBesideAnInstantStaysInItsStretchOrGoesToTheNextOne) {
+    TimelineFixture fixture("lte");
+    fixture.drive(2, 10s, 10);
+    const std::uint64_t first = fixture.journal.size();
+    fixture.drive(3, 10s, 10);
+    const auto timeline = fixture.indexed();
+    ASSERT_EQ(timeline->stretches().size(), 2U);
+    const Time start = timeline->stretches()[1].first;
+    const std::uint64_t inSecond = first + 40;
+    const std::uint64_t beside = instantBeside(*timeline, inSecond, start + 2s);
+    EXPECT_GT(beside, first);
+    EXPECT_LE(*timeOf(*timeline, beside), start + 2s);
+    EXPECT_GT(*timeOf(*timeline, beside + 1), start + 2s);
+    EXPECT_EQ(instantBeside(*timeline, inSecond, start - 1min), first);
+    EXPECT_EQ(instantBeside(*timeline, inSecond, start + 1min), fixture.journal.size());
+    EXPECT_EQ(instantBeside(*timeline, 3, start + 1min), first + 1);
+    EXPECT_EQ(instantBeside(*timeline, 3, start - 1min), 0U);
+}
+
 INSTANTIATE_TEST_SUITE_P(Technologies, InstantsTest, testing::ValuesIn(technologyNames()),
                          [](const auto& each) { return std::string(each.param); });
 
