@@ -84,8 +84,7 @@ bool browseOnScreen(const Request& request, SocketDirectory directory, ChildServ
     }
     const GuardedTerminal guard;
     ScreenBrowser browser(std::move(directory), request.onFatalRecord, child,
-                          {sourceName(request.options.source), isReadOnce(request.options.source)},
-                          request.settings, **terminal, notices);
+                          request.options.source, request.settings, **terminal, notices);
     return browser.run();
 }
 

@@ -1,10 +1,12 @@
 #include "browsing/ScreenBrowser.h"
 
 #include "browsing/LinkNotes.h"
+#include "decoding/InstalledKnowledge.h"
 #include "host/KnowledgeFiles.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
 #include "platform/ZoneText.h"
+#include "text/Format.h"
 
 #include <chrono>
 #include <csignal>
@@ -15,17 +17,27 @@ namespace pallax {
 namespace {
 
 constexpr std::chrono::milliseconds kTurnInterval{150};
+constexpr std::chrono::milliseconds kSilentSearch{100};
 
 } // namespace
 
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
-                             ChildService* child, BrowsedSource source, const Settings& settings,
+                             ChildService* child, const Source& source, const Settings& settings,
                              terminal::CursesTerminal& terminal, StandardOutput& notices)
     : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, notices),
       _keys(_link.queue(), terminal.inputDescriptor()), _watch(_link.resources()),
-      _frontEnd(frontEndSurroundings(), terminal.marks()),
-      _preferences(FilePreferences::userFolder()),
-      _session(sessionSurroundings(std::move(source), settings)) {
+      _timeline({.link = _link,
+                 .source = source,
+                 .journal = settings.journal,
+                 .indexed =
+                     [this] {
+                         if (_travel.isAway()) { // the bar grows
+                             needsDisplay();
+                         }
+                     },
+                 .replaced = [this] { _travel.reset(); }}),
+      _travel(travelSurroundings()), _frontEnd(frontEndSurroundings(), terminal.marks()),
+      _preferences(FilePreferences::userFolder()), _session(sessionSurroundings(source, settings)) {
     if (settings.firstScreen == FirstScreen::Overview) {
         _frontEnd.openOverview();
     }
@@ -42,10 +54,41 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
                 },
             .startAfresh = [this] { _session.startAfresh(); },
             .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); },
-            .overview = [this] { return overview(); }};
+            .overview = [this] { return overview(); },
+            .travel = &_travel};
 }
 
-BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource source,
+Travel::Surroundings ScreenBrowser::travelSurroundings() {
+    return {.timeline = [this] { return _timeline.timeline(); },
+            .present = [this] { return _timeline.present(); },
+            .now = [this] { return _link.clock().now(); },
+            .steadyNow = std::chrono::steady_clock::now,
+            .zone = [this](Time time) { return _link.clock().zone(time).offset; },
+            .knowledge = installedKnowledge(),
+            .progress = [this](double share) { return searchOn(share); }};
+}
+
+/// Draws how far a long search is, and looks for the key that stops it.
+bool ScreenBrowser::searchOn(double share) {
+    const auto now = std::chrono::steady_clock::now();
+    if (!_searchBegan) {
+        _searchBegan = now;
+    }
+    if (now - *_searchBegan < kSilentSearch) {
+        return true;
+    }
+    _frontEnd.setMessage(
+        formatText("Searching: %d %%. Esc stops.", {static_cast<int>(share * 100)}));
+    _terminal.show(_frontEnd.draw());
+    while (const auto key = _terminal.read()) {
+        if (key->key == terminal::Key::Escape) {
+            return false;
+        }
+    }
+    return true;
+}
+
+BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(const Source& source,
                                                                  const Settings& settings) {
     return {.toolkit = _frontEnd.toolkit(),
             .files = _files,
@@ -59,6 +102,8 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource s
                 [this](ModelObserver& observer) {
                     auto model = std::make_unique<PallaxModel>(_link.platform(), observer);
                     model->addSampleSink(_watch);
+                    model->onPacket(
+                        [this](Bytes packet, Time time) { _timeline.add(packet, time); });
                     return model;
                 },
             .face = {.message = [this](const auto& text) { _frontEnd.setMessage(text); },
@@ -66,10 +111,11 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource s
                      .origin =
                          [this](const auto& technology, const auto& name) {
                              _watch.begin(technology);
+                             _timeline.begin(technology);
                              _frontEnd.setOrigin({technology, name});
                          },
                      .oldValues = [this](const auto& time) { _frontEnd.setOldValues(time); }},
-            .source = std::move(source),
+            .source = {sourceName(source), isReadOnce(source)},
             .isSourceGone = [this] { return _link.childHasEnded(); },
             .lookInterval = BrowseLink::kLookInterval,
             .snapshotDirectory = settings.snapshotDirectory,
@@ -86,8 +132,10 @@ Overview ScreenBrowser::overview() {
         }
         _names = std::move(installed.names);
     }
+    const QualityProfile profile = *builtInProfile(kDefaultProfile);
     const Time now = _link.clock().now();
-    Overview overview = _watch.overview(now, *_names, *builtInProfile(kDefaultProfile));
+    Overview overview = _travel.isAway() ? overviewAt(_travel.moment(), *_names, profile)
+                                         : _watch.overview(now, *_names, profile);
     overview.ahead = _link.clock().zone(now).offset;
     return overview;
 }
@@ -117,6 +165,7 @@ void ScreenBrowser::waitForKey() {
 /// One key at a time: what it posts to the queue comes before the next one.
 void ScreenBrowser::readKey() {
     if (const auto key = _terminal.read()) {
+        _searchBegan.reset();
         _frontEnd.handle(*key);
         _link.queue().async([this] { readKey(); });
     } else if (_terminal.isHungUp()) {

@@ -1,14 +1,17 @@
 #pragma once
 
 #include "app/BrowsingSession.h"
+#include "browsing/ViewedTimeline.h"
 #include "host/FilePreferences.h"
 #include "host/HostFileSystem.h"
 #include "knowledge/Networks.h"
 #include "link/BrowseLink.h"
 #include "overview/StatusWatch.h"
+#include "travel/Travel.h"
 #include "ui/terminal/CursesTerminal.h"
 #include "ui/terminal/FrontEnd.h"
 
+#include <chrono>
 #include <memory>
 #include <optional>
 
@@ -22,7 +25,7 @@ public:
     /// Terminal and notices must outlive the browser: errors and notices are printed once the
     /// terminal is restored.
     ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                  BrowsedSource source, const Settings& settings,
+                  const Source& source, const Settings& settings,
                   terminal::CursesTerminal& terminal, StandardOutput& notices);
     ScreenBrowser(const ScreenBrowser&) = delete;
     ScreenBrowser& operator=(const ScreenBrowser&) = delete;
@@ -31,8 +34,10 @@ public:
     bool run();
 
 private:
-    BrowsingSession::Surroundings sessionSurroundings(BrowsedSource source,
+    BrowsingSession::Surroundings sessionSurroundings(const Source& source,
                                                       const Settings& settings);
+    Travel::Surroundings travelSurroundings();
+    bool searchOn(double share);
     terminal::FrontEnd::Surroundings frontEndSurroundings();
     void waitForKey();
     void readKey();
@@ -47,6 +52,9 @@ private:
     BrowseLink _link;
     DescriptorWatch _keys;
     StatusWatch _watch;
+    ViewedTimeline _timeline;
+    Travel _travel;
+    std::optional<std::chrono::steady_clock::time_point> _searchBegan; ///< while one goes on
     std::optional<NetworkNames> _names; ///< read when the overview is drawn for the first time
     terminal::FrontEnd _frontEnd;
     HostFileSystem _files;

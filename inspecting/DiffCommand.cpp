@@ -11,6 +11,7 @@
 #include "host/Snapshot.h"
 #include "host/WallClock.h"
 #include "inspecting/DiffText.h"
+#include "overview/DifferenceText.h"
 #include "text/Format.h"
 #include "text/Printable.h"
 
@@ -112,7 +113,7 @@ ExitStatus DiffCommand::compare(ViewedFile& before, const std::optional<TimeText
     if (_options.json) {
         appendDifferencesJson(output.text(), differences);
     } else if (!differences.empty()) {
-        const auto momentOf = [&](const ViewedFile& file, const Moment& moment) {
+        const auto momentOf = [&](const ViewedFile& file, const ViewedMoment& moment) {
             return formatText(
                 "%@, %@", {printable(file.name()), localDateText(moment.time, ahead(moment.time))});
         };

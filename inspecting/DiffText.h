@@ -7,8 +7,6 @@
 
 namespace pallax {
 
-/// The differences below the names of their sections and entries, as the display has them.
-void appendDifferencesText(std::string& out, const std::vector<Difference>& differences);
 /// A line with a JSON object for each difference.
 void appendDifferencesJson(std::string& out, const std::vector<Difference>& differences);
 

@@ -142,7 +142,7 @@ Result<ViewedFile::Place, NotSeen> ViewedFile::find(const TimeText& text,
     return NotSeen{_name + ": " + text.errorOutside(span, zone).sentence};
 }
 
-Moment ViewedFile::end() {
+ViewedMoment ViewedFile::end() {
     if (_timeline == nullptr) {
         return {_displays.back().values, _displays.back().time};
     }
@@ -150,7 +150,8 @@ Moment ViewedFile::end() {
     return {_timeline->valuesAt(packets), _timeline->stretches().back().latest, packets};
 }
 
-Result<Moment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text, const ZoneRule& zone) {
+Result<ViewedMoment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text,
+                                             const ZoneRule& zone) {
     if (_timeline != nullptr && _timeline->packets() == 0) {
         return NotSeen{formatText("%@ holds no packets.", {_name}), true};
     }
@@ -164,14 +165,14 @@ Result<Moment, NotSeen> ViewedFile::at(const std::optional<TimeText>& text, cons
     if (_timeline != nullptr) {
         const std::uint64_t instant =
             _timeline->instantIn(_timeline->stretches()[place->stretch], place->time);
-        return Moment{_timeline->valuesAt(instant), place->time, instant};
+        return ViewedMoment{_timeline->valuesAt(instant), place->time, instant};
     }
     const Display* latest = nullptr;
     for (const Display& display : _displays) {
         const bool isBefore = display.stretch == place->stretch && display.time <= place->time;
         latest = isBefore ? &display : latest;
     }
-    return Moment{latest->values, latest->time, 0, latest != &_displays.back()};
+    return ViewedMoment{latest->values, latest->time, 0, latest != &_displays.back()};
 }
 
 std::vector<std::string> ViewedFile::notes() const {

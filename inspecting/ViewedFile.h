@@ -24,7 +24,7 @@ struct NotSeen {
 };
 
 /// The values of a file at one time.
-struct Moment {
+struct ViewedMoment {
     CurrentValues values; ///< valid as long as the file
     Time time;
     std::uint64_t packet = 0; ///< 0 in a snapshot
@@ -48,7 +48,7 @@ public:
     /// back before it. A time is looked for in the first stretch that has it; one that is counted
     /// from the end goes back through the stretches. In a snapshot: the latest display that is not
     /// later.
-    Result<Moment, NotSeen> at(const std::optional<TimeText>& time, const ZoneRule& zone);
+    Result<ViewedMoment, NotSeen> at(const std::optional<TimeText>& time, const ZoneRule& zone);
 
     const std::string& name() const { return _name; }
     const RecordedTechnology& technology() const { return *_technology; }
@@ -74,7 +74,7 @@ private:
     Result<Place, NotSeen> find(const TimeText& time, const ZoneRule& zone) const;
     static std::optional<Place> findBeforeEnd(std::chrono::nanoseconds distance,
                                               const std::vector<TimeSpan::Stretch>& stretches);
-    Moment end();
+    ViewedMoment end();
 
     std::string _name;
     const RecordedTechnology* _technology = nullptr;

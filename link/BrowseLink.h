@@ -36,6 +36,7 @@ public:
     SourceClock& clock() { return _clock; }
     const Clock& present() const { return _wallClock; }
     const Resources& resources() const { return _resources; }
+    const Bundle& bundle() const { return _bundle; }
     ModemLink::Platform platform();
     /// See LinkPorts.
     const std::string& obstacle() const { return _linkPorts.obstacle(); }

@@ -1,6 +1,5 @@
 #include "live/LiveTimeline.h"
 
-#include "platform/MainQueue.h"
 #include "platform/RecordedTechnology.h"
 #include "text/Format.h"
 
@@ -19,7 +18,7 @@ void LiveTimeline::add(const RecordedTechnology& technology, Time stamp, Bytes p
         begin(technology);
     }
     _journal->add(stamp, packet);
-    indexLater();
+    _slices.start(*_timeline);
 }
 
 void LiveTimeline::begin(const RecordedTechnology& technology) {
@@ -28,37 +27,18 @@ void LiveTimeline::begin(const RecordedTechnology& technology) {
             formatText("The modem's technology is now %@ (%@); the packets before are dropped.",
                        {technology.identifier, technology.commandName}));
     }
+    _slices.stop();
     _timeline.reset();
     _technology = &technology;
     _journal = std::make_unique<BoundedJournal>(BoundedJournal::stateFolder(), _setup.journal);
     _timeline =
         std::make_unique<Timeline>(*_journal, DecodingSource{technology, _setup.resources,
                                                              _setup.bundle, _setup.technologies});
-}
-
-void LiveTimeline::indexLater() {
-    if (_slice == nullptr) {
-        _slice = std::make_shared<LiveTimeline*>(this);
-        _setup.queue.async([weak = std::weak_ptr(_slice)] {
-            if (const auto self = weak.lock()) {
-                (*self)->indexSlice();
-            }
-        });
-    }
-}
-
-void LiveTimeline::indexSlice() {
-    _slice.reset();
-    const auto end = _setup.steadyNow() + kLongestSlice;
-    const bool isAll = _timeline->index([&] { return _setup.steadyNow() < end; });
-    if (!isAll) {
-        indexLater();
-    }
-    _setup.indexed(*_timeline);
+    _setup.replaced();
 }
 
 void LiveTimeline::finish() {
-    _slice.reset();
+    _slices.stop();
     if (_timeline != nullptr) {
         (void)_timeline->index();
         _setup.indexed(*_timeline);

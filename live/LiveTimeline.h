@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/BoundedJournal.h"
+#include "live/IndexingSlices.h"
 #include "timeline/Timeline.h"
 
 #include <chrono>
@@ -19,10 +20,6 @@ class MainQueue;
 /// indexed in slices, between the other blocks of the main queue.
 class LiveTimeline {
 public:
-    /// A slice ends after so much time, at the next packet at which the timeline asks.
-    static constexpr std::chrono::milliseconds kLongestSlice{5};
-    using SteadyNow = std::function<std::chrono::steady_clock::time_point()>;
-
     /// All references must outlive the timeline.
     struct Setup {
         MainQueue& queue;
@@ -34,10 +31,13 @@ public:
         std::function<void(const std::string& sentence)> report;
         /// Called after a slice.
         std::function<void(Timeline& timeline)> indexed = [](Timeline&) {};
-        SteadyNow steadyNow = std::chrono::steady_clock::now; ///< measures slices
+        IndexingSlices::SteadyNow steadyNow = std::chrono::steady_clock::now;
+        /// Called when a timeline has been replaced by one of another technology.
+        std::function<void()> replaced = [] {};
     };
 
-    explicit LiveTimeline(Setup setup) : _setup(std::move(setup)) {}
+    explicit LiveTimeline(Setup setup)
+        : _setup(std::move(setup)), _slices(_setup.queue, _setup.indexed, _setup.steadyNow) {}
 
     /// A packet of another technology than the one before begins a new timeline. Exceptions of the
     /// resources pass through.
@@ -52,14 +52,12 @@ public:
 
 private:
     void begin(const RecordedTechnology& technology);
-    void indexLater();
-    void indexSlice();
 
     Setup _setup;
     const RecordedTechnology* _technology = nullptr;
     std::unique_ptr<BoundedJournal> _journal; // outlives the timeline
     std::unique_ptr<Timeline> _timeline;
-    std::shared_ptr<LiveTimeline*> _slice; ///< exists while the next slice is on the queue
+    IndexingSlices _slices;
 };
 
 } // namespace pallax

@@ -12,7 +12,11 @@ PallaxModel::PallaxModel(const Platform& platform, ModelObserver& observer)
       _link(platform, *this), _alive(std::make_shared<PallaxModel*>(this)) {}
 
 void PallaxModel::updateWithData(Bytes data) {
-    _driver.update(data, {.time = _clock.now()});
+    const Time time = _clock.now();
+    _driver.update(data, {.time = time});
+    if (_packetRead) {
+        _packetRead(data, time);
+    }
 }
 
 void PallaxModel::generatorChosen(const std::string& technology) {

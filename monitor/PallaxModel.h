@@ -7,6 +7,7 @@
 #include "plist/PropertyList.h"
 
 #include <chrono>
+#include <functional>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -72,6 +73,10 @@ public:
         _frameObservers.push_back(std::move(observer));
     }
 
+    /// Gets each packet after it was read, with the time of the display's clock.
+    using PacketRead = std::function<void(Bytes packet, Time time)>;
+    void onPacket(PacketRead packetRead) { _packetRead = std::move(packetRead); }
+
     /// As in DisplayDriver.
     void addSampleSink(SampleSink& sink) { _driver.addSampleSink(sink); }
     void removeSampleSink(const SampleSink& sink) { _driver.removeSampleSink(sink); }
@@ -94,6 +99,7 @@ private:
     std::shared_ptr<const PathDictionary> _nodesByPath;
     std::vector<std::weak_ptr<FrameObserver>> _frameObservers;
     FrameRef _frame; // the latest
+    PacketRead _packetRead;
     ModemLink _link;
     /// Blocks on the queue hold it weakly, so they do nothing after the model's end.
     std::shared_ptr<PallaxModel*> _alive;

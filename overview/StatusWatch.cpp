@@ -1,10 +1,29 @@
 #include "overview/StatusWatch.h"
 
 #include "platform/RecordedTechnology.h"
+#include "timeline/Instants.h"
 
 #include <algorithm>
 
 namespace pallax {
+
+Overview overviewAt(const Moment& moment, const NetworkNames& names,
+                    const QualityProfile& profile) {
+    const auto time =
+        moment.timeline == nullptr ? std::nullopt : timeOf(*moment.timeline, moment.instant);
+    if (!time) {
+        return {};
+    }
+    Overview overview{statusOf(moment.timeline->valuesAt(moment.instant), *time, names, profile),
+                      {}};
+    const std::vector<Event>& events = moment.timeline->events();
+    const auto past = std::upper_bound(
+        events.begin(), events.end(), moment.instant,
+        [](std::uint64_t instant, const Event& event) { return instant < event.packet; });
+    const auto count = std::min<std::ptrdiff_t>(past - events.begin(), StatusWatch::kMostEvents);
+    overview.events.assign(past - count, past);
+    return overview;
+}
 
 StatusWatch::Known::Known(const RecordedTechnology& technology, const Resources& resources)
     : fields(technology, resources), values(fields, entries),
@@ -12,12 +31,8 @@ StatusWatch::Known::Known(const RecordedTechnology& technology, const Resources&
 
 void StatusWatch::begin(std::string_view technology) {
     _known.reset();
-    const auto all = recordedTechnologies();
-    const auto found = std::find_if(all.begin(), all.end(), [technology](const auto& each) {
-        return each.identifier == technology;
-    });
-    if (found != all.end()) {
-        _known = std::make_unique<Known>(*found, _resources);
+    if (const RecordedTechnology* known = technologyOfIdentifier(technology)) {
+        _known = std::make_unique<Known>(*known, _resources);
         _known->values.setListener(this);
     }
 }

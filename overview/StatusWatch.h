@@ -4,6 +4,7 @@
 #include "packets/StampSequence.h"
 #include "timeline/Event.h"
 #include "timeline/EventFinder.h"
+#include "timeline/Moment.h"
 
 #include <memory>
 #include <string_view>
@@ -19,6 +20,9 @@ struct Overview {
     std::vector<Event> events;     ///< the latest last
     std::chrono::seconds ahead{0}; ///< local time minus UTC
 };
+
+/// What was known at an instant of a timeline.
+Overview overviewAt(const Moment& moment, const NetworkNames& names, const QualityProfile& profile);
 
 /// Takes the samples of a live model, so that the status can be asked for at any time.
 class StatusWatch final : public SampleSink, private CurrentValues::Listener {

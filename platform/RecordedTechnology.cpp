@@ -38,4 +38,8 @@ const RecordedTechnology* technologyOfCommandName(std::string_view name) {
     return firstThat([&](const RecordedTechnology& each) { return each.commandName == name; });
 }
 
+const RecordedTechnology* technologyOfIdentifier(std::string_view identifier) {
+    return firstThat([&](const RecordedTechnology& each) { return each.identifier == identifier; });
+}
+
 } // namespace pallax

@@ -17,5 +17,6 @@ struct RecordedTechnology {
 std::span<const RecordedTechnology> recordedTechnologies();
 const RecordedTechnology* technologyOfLinkType(int linkType);
 const RecordedTechnology* technologyOfCommandName(std::string_view name);
+const RecordedTechnology* technologyOfIdentifier(std::string_view identifier);
 
 } // namespace pallax

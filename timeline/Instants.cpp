@@ -126,15 +126,6 @@ void forEachTick(Timeline& timeline, const TimelineKeyFrame& from, const Visit& 
     }
 }
 
-/// The stretch of an instant; null before the first packet.
-const Stretch* stretchOfInstant(const Timeline& timeline, std::uint64_t instant) {
-    const auto& stretches = timeline.stretches();
-    const auto past = std::upper_bound(
-        stretches.begin(), stretches.end(), instant,
-        [](std::uint64_t at, const Stretch& stretch) { return at < stretch.firstPacket; });
-    return past == stretches.begin() ? nullptr : &*(past - 1);
-}
-
 } // namespace
 
 std::vector<ShownTick> ticksAt(Timeline& timeline, Time time) {
@@ -188,7 +179,7 @@ std::optional<Time> timeOf(Timeline& timeline, std::uint64_t instant) {
 
 std::uint64_t instantBeside(Timeline& timeline, std::uint64_t instant, Time time) {
     const std::uint64_t first = timeline.firstInstant();
-    const Stretch* stretch = stretchOfInstant(timeline, instant);
+    const Stretch* stretch = timeline.stretchOfInstant(instant);
     if (stretch == nullptr) {
         return instant;
     }

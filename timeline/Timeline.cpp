@@ -45,6 +45,16 @@ const Stretch* Timeline::stretchOf(Time time) const {
     return nearest;
 }
 
+const Stretch* Timeline::stretchOfInstant(std::uint64_t instant) const {
+    const auto past = std::upper_bound(
+        _stretches.begin(), _stretches.end(), instant,
+        [](std::uint64_t at, const Stretch& stretch) { return at < stretch.firstPacket; });
+    if (_stretches.empty()) {
+        return nullptr;
+    }
+    return past == _stretches.begin() ? &_stretches.front() : &*(past - 1);
+}
+
 std::optional<std::uint64_t> Timeline::instantAt(Time time) const {
     const Stretch* stretch = stretchOf(time);
     return stretch != nullptr ? std::optional(instantIn(*stretch, time)) : std::nullopt;

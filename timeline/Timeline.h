@@ -71,6 +71,8 @@ public:
     /// The stretch in which a time is looked for: the first that has it, or else the one that ends
     /// latest before it; null before the first packet.
     const Stretch* stretchOf(Time time) const;
+    /// The stretch of an instant: that of its packet, or the first one; null before any packet.
+    const Stretch* stretchOfInstant(std::uint64_t instant) const;
 
     const FieldTable& fields() const { return _fields; }
     const EntryTable& entries() const { return _entries; }

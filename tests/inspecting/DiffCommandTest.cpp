@@ -2,6 +2,7 @@
 
 #include "console/Output.h"
 #include "inspecting/DiffText.h"
+#include "overview/DifferenceText.h"
 #include "tests/inspecting/InspectingFixture.h"
 
 #include <filesystem>

@@ -1,8 +1,11 @@
 #include "ui/terminal/Bars.h"
 
+#include "ui/terminal/LineEditor.h"
 #include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
+#include <cmath>
+#include <set>
 
 namespace pallax::terminal {
 
@@ -38,11 +41,21 @@ bool isLoading(const ui::BarItems& items) {
 }
 
 int Bars::drawOrigin(int right, int columns) {
-    const std::string text = originText(_status.origin, _marks, columns);
-    if (text.empty()) {
-        return right;
+    int room = columns;
+    int left = right;
+    if (_status.timeBar) {
+        const std::string& all = _status.timeBar->words;
+        const std::string words = columnsOf(all) <= columns ? all : all.substr(0, all.find(','));
+        left -= columnsOf(words);
+        room -= columnsOf(words) + kGap;
+        _grid.put(left, kTitleRow, words, {.bold = true});
+        left -= kGap;
     }
-    const int left = right - columnsOf(text);
+    const std::string text = originText(_status.origin, _marks, room);
+    if (text.empty()) {
+        return left;
+    }
+    left -= columnsOf(text);
     _grid.put(left, kTitleRow, text, kSecondary);
     return left - kGap;
 }
@@ -97,6 +110,72 @@ int Bars::drawStatus(const ui::BarItems& items, int ruleRight) {
     }
     (void)_grid.put(kMargin, y - 1, _status.note + " ", {}, {kMargin, ruleRight}); // in the rule
     return x;
+}
+
+void Bars::drawLastRow(const ui::BarItems& items, int ruleRight, const std::vector<Hint>& hints) {
+    if (_status.prompt) {
+        return drawPrompt(*_status.prompt);
+    }
+    if (!_status.timeBar || _status.message) {
+        return drawHints(hints, drawStatus(items, ruleRight));
+    }
+    drawHints({{"[ ] event", typed(U']')},
+               {": go to", typed(U':')},
+               {", . step", typed(U'.')},
+               {_status.timeBar->isPlaying ? "Space hold" : "Space play", typed(U' ')},
+               {"$ present", typed(U'$')},
+               {"? help", typed(U'?')}},
+              drawTimeBar(*_status.timeBar));
+}
+
+void Bars::drawPrompt(const Prompt& prompt) {
+    const LineEditor& editor = *prompt.editor;
+    const int y = _grid.rows() - 1;
+    const int start = kMargin + columnsOf(prompt.mark) + 1;
+    const int cursor = columnsOf(std::string_view(editor.text()).substr(0, editor.cursor()));
+    const int last = _grid.columns() - 1 - kMargin;
+    // A long text is scrolled so that the cursor stays visible.
+    const int offset = std::max(start + cursor - last, 0);
+    _grid.put(kMargin, y, prompt.mark, {.bold = true});
+    const int end = _grid.put(start - offset, y, editor.text(), {}, {start, last});
+    _grid.setCursor({start + cursor - offset, y});
+    const int left = _grid.columns() - kMargin - columnsOf(prompt.hint.text);
+    if (left > end + 1) {
+        drawHint(left, prompt.hint.text, prompt.hint.key);
+    }
+}
+
+/// Returns the column after the bar and its clock.
+int Bars::drawTimeBar(const TimeBar& bar) {
+    constexpr int kLeastLength = 8;
+    constexpr int kShare = 4; // of the row, one part
+    const int y = _grid.rows() - 1;
+    const int length = std::max(_grid.columns() / kShare, kLeastLength);
+    int x = _grid.put(kMargin, y, _marks.timeBegin, kSecondary);
+    const int first = x;
+    const auto columnOfPlace = [first, length](double place) {
+        return first + static_cast<int>(std::lround(place * (length - 1)));
+    };
+    _grid.fill({first, first + length}, y, _marks.horizontal, kSecondary);
+    std::set<int> events;
+    for (const double event : bar.events) {
+        events.insert(columnOfPlace(event));
+    }
+    if (static_cast<int>(events.size()) <= length / 2) { // more would tell nothing
+        for (const int column : events) {
+            _grid.put(column, y, _marks.timeEvent, kSecondary);
+        }
+    }
+    if (bar.marked) {
+        _grid.put(columnOfPlace(*bar.marked), y, _marks.timeMark);
+    }
+    _grid.put(columnOfPlace(bar.shown), y, _marks.timeShown, {.accent = true});
+    for (int place = 0; place < length; ++place) {
+        const double share = static_cast<double>(place) / (length - 1);
+        _hits.add(first + place, y, 1, 1, [go = bar.go, share] { go(share); });
+    }
+    x = _grid.put(first + length, y, _marks.timeEnd, kSecondary);
+    return _grid.put(x + 1, y, bar.clock);
 }
 
 void Bars::drawHint(int left, std::string_view text, const KeyEvent& key) {

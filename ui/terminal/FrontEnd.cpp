@@ -15,7 +15,11 @@ constexpr int kScrollColumns = 8; // per key, in a row that does not fit
 } // namespace
 
 FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
-    : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }) {}
+    : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }),
+      _modalKeys([this] { needsDisplay(); }),
+      _time({_surroundings.travel, _toolkit,
+             [this](std::string text) { setMessage(std::move(text)); },
+             [this] { needsDisplay(); }}) {}
 
 /// Click areas may be out of date until the next drawing.
 void FrontEnd::needsDisplay() {
@@ -23,16 +27,22 @@ void FrontEnd::needsDisplay() {
     _surroundings.needsDisplay();
 }
 
+TerminalNavigation* FrontEnd::navigation() const {
+    TerminalNavigation* live = _toolkit.navigation();
+    TerminalNavigation* held = live == nullptr ? nullptr : _time.panes(*live);
+    return held != nullptr ? held : live;
+}
+
 TerminalTable* FrontEnd::table() const {
-    TerminalNavigation* navigation = _toolkit.navigation();
-    return navigation == nullptr ? nullptr : &terminalTable(navigation->top().table());
+    TerminalNavigation* panes = navigation();
+    return panes == nullptr ? nullptr : &terminalTable(panes->top().table());
 }
 
 Grid FrontEnd::draw() {
     Grid grid(_toolkit.columns(), _toolkit.rows());
     _hits.clear();
-    TerminalNavigation* navigation = _toolkit.navigation();
-    if (navigation == nullptr) {
+    TerminalNavigation* panes = navigation();
+    if (panes == nullptr) {
         return grid;
     }
     if (grid.columns() < kLeastColumns || grid.rows() < kLeastRows) {
@@ -40,9 +50,9 @@ Grid FrontEnd::draw() {
         return grid;
     }
     endFilterOfOtherPane();
-    drawScreen(grid, *navigation);
-    if (const auto& modal = navigation->modal()) {
-        ModalView(grid, _marks, _hits).draw(*modal, _modalFocus);
+    drawScreen(grid, *panes);
+    if (const auto& modal = _toolkit.navigation()->modal()) {
+        ModalView(grid, _marks, _hits).draw(*modal, _modalKeys.focus());
     }
     if (_help.isOpen()) {
         _help.draw(grid, _marks);
@@ -56,7 +66,9 @@ Grid FrontEnd::draw() {
 /// The topmost pane, or the page over it.
 void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
     const PaneStatus status{.spinnerTurn = _spinnerTurn,
-                            .filterEditor = _filterEditor ? &*_filterEditor : nullptr,
+                            .prompt = _filterEditor ? Prompt{"/", &*_filterEditor, kClearFilter}
+                                                    : _time.prompt(),
+                            .timeBar = _time.bar(),
                             .message = _message,
                             .note = _note,
                             .origin = _origin,
@@ -98,12 +110,15 @@ void FrontEnd::setOldValues(std::string time) {
 
 bool FrontEnd::isAnimated() const {
     const TerminalNavigation* navigation = _toolkit.navigation();
-    return navigation != nullptr && isLoading(navigation->top().toolbarItems());
+    return _time.isPlaying() ||
+           (navigation != nullptr && isLoading(navigation->top().toolbarItems()));
 }
 
 void FrontEnd::turn() {
     ++_spinnerTurn;
-    needsDisplay();
+    if (_time.turn() || !_time.isPlaying()) {
+        needsDisplay();
+    }
 }
 
 void FrontEnd::handle(const KeyEvent& event) {
@@ -123,20 +138,22 @@ void FrontEnd::handle(const KeyEvent& event) {
     // A copy, because the action may close the screen.
     const std::shared_ptr<ui::ModalScreen> modal = navigation->modal();
     if (!modal) {
-        _modalFocus = ModalFocus::Save; // for the next one to be opened
+        _modalKeys.reset(); // for the next one to be opened
     }
     if (_toolkit.alert() != nullptr) {
         handleAlert(event);
     } else if (_help.isOpen()) {
         _help.handle(event);
         needsDisplay();
+    } else if (_time.isTyping() && event.key != Key::Click) {
+        (void)_time.handle(event);
     } else if (_pages.isOpen() && event.key != Key::Click) {
         handlePage(event);
     } else if (event.key == Key::Click || event.key == Key::WheelUp ||
                event.key == Key::WheelDown) {
         handleMouse(event);
     } else if (modal) {
-        handleModal(*modal, event);
+        _modalKeys.handle(*modal, event);
     } else if (_filterEditor) {
         handleFilter(*table(), event);
     } else {
@@ -170,57 +187,37 @@ void FrontEnd::handleAlert(const KeyEvent& event) {
     }
 }
 
-void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
-    TerminalTextField& field = terminalTextField(screen.field());
-    if (event.key == Key::Escape) {
-        if (field.isEditing() && !field.text().empty()) {
-            field.resignFirstResponder(); // so one key does not discard the typed text
-        } else {
-            screen.cancelPressed();
-        }
-        return;
-    }
-    if (event.key == Key::PageUp || event.key == Key::PageDown) {
-        TerminalTable& list = terminalTable(screen.list());
-        list.scroll(event.key == Key::PageUp ? -list.page() : list.page());
-        return;
-    }
-    const bool forwards = event.key == Key::Tab || event.key == Key::Down;
-    const bool backwards = event.key == Key::BackTab || event.key == Key::Up;
-    if (field.isEditing()) {
-        if (forwards || backwards) {
-            _modalFocus = forwards ? ModalFocus::Save : ModalFocus::Cancel;
-            field.resignFirstResponder();
-        } else if (field.handle(event) && !field.isEditing()) {
-            _modalFocus = ModalFocus::Save; // after the return key
-        }
-        return;
-    }
-    if (event.key == Key::Enter || (event.key == Key::Character && event.character == U' ')) {
-        _modalFocus == ModalFocus::Save ? screen.savePressed() : screen.cancelPressed();
-        return;
-    }
-    const bool isSave = _modalFocus == ModalFocus::Save;
-    if ((forwards && !isSave) || (backwards && isSave)) {
-        field.beginEditing();
-    } else if (forwards || backwards || event.key == Key::Left || event.key == Key::Right) {
-        _modalFocus = isSave ? ModalFocus::Cancel : ModalFocus::Save;
-        needsDisplay();
-    }
-}
-
 /// The keys for help, a fresh start and quitting work as in a pane.
 void FrontEnd::handlePage(const KeyEvent& event) {
     if (_pages.handle(event) != PageAnswer::NotMine) {
         return needsDisplay();
     }
     const char32_t character = event.key == Key::Character ? event.character : 0;
-    if (character == U'q' && !_toolkit.navigation()->isAtRoot()) {
+    if (handleTime(event)) {
+        return;
+    }
+    if (character == U'q' && !navigation()->isAtRoot()) {
         _pages.closeTop();
         needsDisplay();
     } else if (character == U'q' || character == U'?' || character == U'R') {
         handlePaneCharacter(character);
     }
+}
+
+bool FrontEnd::handleTime(const KeyEvent& event) {
+    if (event.key == Key::Character && event.character == U'd' && _surroundings.travel != nullptr) {
+        openChanges();
+        return true;
+    }
+    return _time.handle(event);
+}
+
+void FrontEnd::openChanges() {
+    if (!_time.hasMark()) {
+        return setMessage("Mark an instant first, with the key m.");
+    }
+    _pages.open(ChangesPage([this]() -> const ChangesPage::Content& { return _time.changes(); }));
+    needsDisplay();
 }
 
 void FrontEnd::handleFilter(TerminalTable& table, const KeyEvent& event) {
@@ -255,13 +252,15 @@ void FrontEnd::handlePane(const KeyEvent& event) {
         goBack(pane);
         return;
     case Key::Backspace:
-        _toolkit.navigation()->back();
+        navigation()->back();
         return;
     case Key::Escape:
         escape(pane);
         return;
     case Key::Character:
-        handlePaneCharacter(event.character);
+        if (!handleTime(event)) {
+            handlePaneCharacter(event.character);
+        }
         return;
     default:
         return;
@@ -297,8 +296,7 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
     case U'R':
         return _surroundings.startAfresh();
     case U'q':
-        return _toolkit.navigation()->isAtRoot() ? _surroundings.quit()
-                                                 : _toolkit.navigation()->back();
+        return navigation()->isAtRoot() ? _surroundings.quit() : navigation()->back();
     default:
         return;
     }
@@ -340,13 +338,13 @@ void FrontEnd::openOrScroll(TerminalTable& table, bool mayScroll) {
 
 void FrontEnd::goBack(TerminalTable& table) {
     if (!table.scrollSideways(-kScrollColumns)) {
-        _toolkit.navigation()->back();
+        navigation()->back();
     }
 }
 
 void FrontEnd::escape(TerminalTable& table) {
     if (table.pane().filter().empty()) {
-        _toolkit.navigation()->back();
+        navigation()->back();
     } else {
         table.setFilter("");
     }
@@ -363,6 +361,9 @@ void FrontEnd::save() {
     }
     const auto action = button->action; // a copy, because the items may be replaced
     action();
+    if (_time.isAway()) {
+        setMessage("The present is saved, not the instant that is shown.");
+    }
 }
 
 void FrontEnd::copyValue(TerminalTable& table) {
@@ -376,12 +377,12 @@ void FrontEnd::startFilter(TerminalTable& table) {
     LineEditor editor;
     editor.setText(table.pane().filter());
     _filterEditor = std::move(editor);
-    _filteredPane = _toolkit.navigation()->screens().back();
+    _filteredPane = navigation()->screens().back();
     needsDisplay();
 }
 
 void FrontEnd::endFilterOfOtherPane() {
-    if (_filteredPane.lock() != _toolkit.navigation()->screens().back()) {
+    if (_filteredPane.lock() != navigation()->screens().back()) {
         _filterEditor.reset();
     }
 }

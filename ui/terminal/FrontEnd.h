@@ -6,10 +6,11 @@
 #include "ui/terminal/Keys.h"
 #include "ui/terminal/LineEditor.h"
 #include "ui/terminal/Marks.h"
-#include "ui/terminal/ModalView.h"
+#include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/Origin.h"
 #include "ui/terminal/Pages.h"
 #include "ui/terminal/TerminalToolkit.h"
+#include "ui/terminal/TimeControl.h"
 
 #include <functional>
 #include <memory>
@@ -34,6 +35,8 @@ public:
         std::function<std::string()> zone = [] { return std::string(); };
         /// What the overview shows now.
         std::function<Overview()> overview = [] { return Overview(); };
+        /// Goes back in time; null if there is only the present. Must outlive the front end.
+        Travel* travel = nullptr;
     };
 
     FrontEnd(Surroundings surroundings, const Marks& marks);
@@ -68,8 +71,13 @@ private:
     void drawScreen(Grid& grid, TerminalNavigation& navigation);
     void handleMouse(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
-    void handleModal(ui::ModalScreen& screen, const KeyEvent& event);
     void handlePage(const KeyEvent& event);
+    /// The keys for time; false for any other.
+    bool handleTime(const KeyEvent& event);
+    void openChanges();
+    /// The panes that are seen: the live ones, or those of the shown instant. Null if there are
+    /// none.
+    TerminalNavigation* navigation() const;
     void handleFilter(TerminalTable& table, const KeyEvent& event);
     void handlePane(const KeyEvent& event);
     void handlePaneCharacter(char32_t character);
@@ -89,7 +97,8 @@ private:
     const Marks& _marks;
     HitMap _hits;
     TerminalToolkit _toolkit;
-    ModalFocus _modalFocus = ModalFocus::Save;
+    ModalKeys _modalKeys;
+    mutable TimeControl _time;
     HelpPage _help;
     Pages _pages;
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed

@@ -18,6 +18,11 @@ struct Marks {
     std::string_view dot;        ///< between technology and source
     std::string_view barFull;    ///< a part of a level's bar
     std::string_view barEmpty;   ///< the rest of the bar
+    std::string_view timeBegin;  ///< where a time bar begins
+    std::string_view timeEnd;    ///< where it ends
+    std::string_view timeShown;  ///< the shown instant in it
+    std::string_view timeMark;   ///< the marked instant in it
+    std::string_view timeEvent;  ///< an event in it
     std::string_view check;
     std::string_view horizontal;
     std::string_view vertical;
@@ -28,44 +33,12 @@ struct Marks {
     std::array<std::string_view, 4> spinner;
 };
 
-inline constexpr Marks kUtf8Marks{false,
-                                  "▌",
-                                  "›",
-                                  "*",
-                                  "…",
-                                  "↑",
-                                  "↓",
-                                  " › ",
-                                  " · ",
-                                  "▆",
-                                  "▁",
-                                  "✓",
-                                  "─",
-                                  "│",
-                                  "┌",
-                                  "┐",
-                                  "└",
-                                  "┘",
-                                  {"⠋", "⠹", "⠴", "⠧"}};
+inline constexpr Marks kUtf8Marks{false, "▌", "›", "*", "…", "↑", "↓", " › ",
+                                  " · ", "▆", "▁", "▕", "▏", "●", "◆", "┴",
+                                  "✓",   "─", "│", "┌", "┐", "└", "┘", {"⠋", "⠹", "⠴", "⠧"}};
 
-inline constexpr Marks kAsciiMarks{true,
-                                   ">",
-                                   ">",
-                                   "*",
-                                   "~",
-                                   "^",
-                                   "v",
-                                   " > ",
-                                   ", ",
-                                   "#",
-                                   ".",
-                                   "x",
-                                   "-",
-                                   "|",
-                                   "+",
-                                   "+",
-                                   "+",
-                                   "+",
-                                   {"|", "/", "-", "\\"}};
+inline constexpr Marks kAsciiMarks{true, ">", ">", "*", "~", "^", "v", " > ",
+                                   ", ", "#", ".", "[", "]", "o", "m", "'",
+                                   "x",  "-", "|", "+", "+", "+", "+", {"|", "/", "-", "\\"}};
 
 } // namespace pallax::terminal

@@ -1,6 +1,31 @@
 #include "ui/terminal/Page.h"
 
+#include "ui/terminal/TextWidth.h"
+
+#include <string>
+
 namespace pallax::terminal {
+
+PageFrame::PageFrame(const PageScreen& screen, const PageSurroundings& around,
+                     std::string_view title)
+    : _screen(screen), _around(around) {
+    Bars bars(screen.grid, screen.marks, screen.hits, around.status);
+    const int end = screen.grid.columns() - kMargin;
+    const std::string way = std::string(around.root).append(screen.marks.crumb).append(title);
+    const int room = bars.drawOrigin(end, end - kMargin - columnsOf(way) - kGap);
+    screen.grid.put(kMargin, kTitleRow, way, {.bold = true}, {kMargin, room});
+}
+
+void PageFrame::finish(const Scrolling& scrolling, int lines,
+                       const std::vector<Hint>& hints) const {
+    Bars bars(_screen.grid, _screen.marks, _screen.hits, _around.status);
+    (void)bars.drawRule(kRowsAbove - 1, _screen.marks.up,
+                        static_cast<std::size_t>(scrolling.first()), Key::PageUp);
+    const int below = std::max(lines - scrolling.first() - rows(), 0);
+    const int ruleRight = bars.drawRule(_screen.grid.rows() - kRowsBelow, _screen.marks.down,
+                                        static_cast<std::size_t>(below), Key::PageDown);
+    bars.drawLastRow(_around.items, ruleRight, hints);
+}
 
 bool goesBack(const KeyEvent& event) {
     switch (event.key) {

@@ -1,8 +1,11 @@
 #pragma once
 
 #include "ui/terminal/Bars.h"
+#include "ui/terminal/Scrolling.h"
 
+#include <algorithm>
 #include <string_view>
+#include <vector>
 
 namespace pallax::terminal {
 
@@ -25,6 +28,23 @@ struct PageSurroundings {
     std::string_view root; ///< the first pane's title
     const ui::BarItems& items;
     const PaneStatus& status;
+};
+
+/// The rows around a page's content: its title, the rules, and the last row.
+class PageFrame {
+public:
+    /// Draws the title.
+    PageFrame(const PageScreen& screen, const PageSurroundings& around, std::string_view title);
+
+    /// The rows of the content, from kRowsAbove on, and its columns.
+    int rows() const { return std::max(_screen.grid.rows() - kRowsAbove - kRowsBelow, 0); }
+    Span span() const { return {kMargin, _screen.grid.columns() - kMargin}; }
+    /// Draws the rules, with the number of lines of `lines` that are hidden, and the last row.
+    void finish(const Scrolling& scrolling, int lines, const std::vector<Hint>& hints) const;
+
+private:
+    PageScreen _screen;
+    const PageSurroundings& _around;
 };
 
 /// Whether a key goes back, as in a pane that is not scrolled sideways.

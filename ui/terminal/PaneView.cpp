@@ -1,7 +1,6 @@
 #include "ui/terminal/PaneView.h"
 
 #include "app/pane/FindIgnoringCase.h"
-#include "ui/terminal/LineEditor.h"
 #include "ui/terminal/TerminalToolkit.h"
 #include "ui/terminal/TextWidth.h"
 
@@ -13,7 +12,6 @@ namespace pallax::terminal {
 
 namespace {
 
-constexpr Hint kClearFilter{"Esc clear filter", {.key = Key::Escape}};
 constexpr Style kBold{.bold = true};
 constexpr Style kDim{.dim = true};
 
@@ -59,6 +57,21 @@ Range wholeCharacters(std::string_view text, Range range) {
     return whole;
 }
 
+/// The most useful keys.
+std::vector<Hint> hintsFor(const ui::BarItems& items, const PaneModel& pane) {
+    std::vector<Hint> hints;
+    if (!pane.filter().empty()) {
+        hints.push_back(kClearFilter);
+    } else if (pane.totalRows() > 0) {
+        hints.push_back({"/ filter", typed(U'/')});
+    }
+    if (saveButtonOf(items) != nullptr) {
+        hints.push_back({"s Save", typed(U's')});
+    }
+    hints.push_back({"? help", typed(U'?')});
+    return hints;
+}
+
 } // namespace
 
 void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
@@ -70,11 +83,9 @@ void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
     drawRows(table);
     drawUpperRule(table, bars, status);
     const int ruleRight = drawLowerRule(table, static_cast<std::size_t>(rows), bars);
-    if (status.filterEditor != nullptr) {
-        drawFilterPrompt(*status.filterEditor, bars);
-    } else if (navigation.isToolbarShown()) {
+    if (status.prompt || navigation.isToolbarShown()) {
         const ui::BarItems& items = navigation.top().toolbarItems();
-        drawHints(items, table, bars.drawStatus(items, ruleRight), bars);
+        bars.drawLastRow(items, ruleRight, hintsFor(items, table.pane()));
     }
 }
 
@@ -209,38 +220,6 @@ void PaneView::drawLabel(const ui::Label& label, int x, int y, Style style, Span
     x = _grid.put(x, y, text.substr(0, found.begin), style, clip);
     x = _grid.put(x, y, text.substr(found.begin, found.end - found.begin), underlined, clip);
     _grid.put(x, y, text.substr(found.end), style, clip);
-}
-
-/// The most useful keys.
-void PaneView::drawHints(const ui::BarItems& items, const TerminalTable& table, int from,
-                         Bars& bars) {
-    std::vector<Hint> hints;
-    if (!table.pane().filter().empty()) {
-        hints.push_back(kClearFilter);
-    } else if (table.pane().totalRows() > 0) {
-        hints.push_back({"/ filter", typed(U'/')});
-    }
-    if (saveButtonOf(items) != nullptr) {
-        hints.push_back({"s Save", typed(U's')});
-    }
-    hints.push_back({"? help", typed(U'?')});
-    bars.drawHints(hints, from);
-}
-
-void PaneView::drawFilterPrompt(const LineEditor& editor, Bars& bars) {
-    const int y = _grid.rows() - 1;
-    const int start = kMargin + 2; // after "/ "
-    const int cursor = columnsOf(std::string_view(editor.text()).substr(0, editor.cursor()));
-    const int last = _grid.columns() - 1 - kMargin;
-    // A long text is scrolled so that the cursor stays visible.
-    const int offset = std::max(start + cursor - last, 0);
-    _grid.put(kMargin, y, "/", kBold);
-    const int end = _grid.put(start - offset, y, editor.text(), {}, {start, last});
-    _grid.setCursor({start + cursor - offset, y});
-    const int left = _grid.columns() - kMargin - columnsOf(kClearFilter.text);
-    if (left > end + 1) {
-        bars.drawHint(left, kClearFilter.text, kClearFilter.key);
-    }
 }
 
 } // namespace pallax::terminal

@@ -29,8 +29,6 @@ private:
                   bool isSelected);
     void drawLabel(const ui::Label& label, int x, int y, Style style, Span clip,
                    std::string_view filter);
-    void drawFilterPrompt(const LineEditor& editor, Bars& bars);
-    void drawHints(const ui::BarItems& items, const TerminalTable& table, int from, Bars& bars);
 
     Grid& _grid;
     const Marks& _marks;

@@ -21,7 +21,7 @@ protected:
 
 TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
     stage.type("?");
-    EXPECT_EQ(stage.screen(80, 24), R"(
+    EXPECT_EQ(stage.screen(80, 33), R"(
  Pallax › Serving Cell Measurements
  ─────────────┌ Keys ───────────────────────────────────────────┐──────────────
 ▌Version      │ Up Down  k j      one row up or down            │            1
@@ -33,6 +33,15 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
               │ Esc               clear the filter, or back     │
               │ /                 filter rows by name or value  │
               │ o                 overview of the radio         │
+              │ Space             hold time; play on from there │
+              │ , .               one tick back or forward      │
+              │ [ ]               to the event before or after  │
+              │ { }               one minute back or forward    │
+              │ ^ $               to the start; present or end  │
+              │ :                 go to a time or a condition   │
+              │ n N               where it holds next or before │
+              │ m d               mark; changes since the mark  │
+              │ ( )               play slower or faster         │
               │ s                 save a snapshot               │
               │ y                 copy the value                │
               │ R                 reconnect, drop old values    │
@@ -76,11 +85,11 @@ TEST_F(FrontEndHelpTest, TheArrowsScrollItWhereItDoesNotFit) {
     (void)stage.frontEnd.draw();
     stage.press(Key::Down);
     EXPECT_EQ(stage.line(1), "│  one row up or   │");
-    stage.press(Key::Down, 50);
+    stage.press(Key::Down, 90);
     EXPECT_EQ(stage.line(3), "│  quit            │");
     stage.press(Key::Up);
     EXPECT_EQ(stage.line(3), "│ Ctrl-C           │");
-    stage.press(Key::Up, 50);
+    stage.press(Key::Up, 90);
     EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
 }
 
@@ -114,7 +123,7 @@ TEST_F(FrontEndHelpTest, HomeAndEndScrollItToItsEndsAndLeaveItOpen) {
     EXPECT_EQ(stage.line(3), "│  quit            │");
     stage.type("g");
     EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
-    stage.frontEnd.resize(80, 24);
+    stage.frontEnd.resize(80, 33);
     const std::string whole = stage.screen();
     stage.press(Key::End);
     EXPECT_EQ(stage.screen(), whole);
@@ -122,10 +131,10 @@ TEST_F(FrontEndHelpTest, HomeAndEndScrollItToItsEndsAndLeaveItOpen) {
 
 TEST_F(FrontEndHelpTest, ScrolledToItsEndItFillsAScreenThatGrows) {
     stage.type("?");
-    const std::string fromTheFirstLine = stage.screen(80, 24);
+    const std::string fromTheFirstLine = stage.screen(80, 33);
     stage.frontEnd.resize(20, 5);
     (void)draw();
-    stage.press(Key::Down, 50);
+    stage.press(Key::Down, 90);
     EXPECT_EQ(stage.screen(20, 7), R"(
 ┌ Keys ────────────┐
 │  back; at the    │
@@ -137,12 +146,12 @@ TEST_F(FrontEndHelpTest, ScrolledToItsEndItFillsAScreenThatGrows) {
 )");
     stage.press(Key::Up); // scrolls at once
     EXPECT_EQ(stage.line(1), "│ q                │");
-    EXPECT_EQ(stage.screen(80, 24), fromTheFirstLine);
+    EXPECT_EQ(stage.screen(80, 33), fromTheFirstLine);
 }
 
 TEST_F(FrontEndHelpTest, TheArrowsDoNothingWhereItFits) {
     stage.type("?");
-    const std::string before = stage.screen(80, 24);
+    const std::string before = stage.screen(80, 33);
     stage.press(Key::Down);
     EXPECT_EQ(stage.screen(), before);
     stage.press(Key::Up);
@@ -209,8 +218,13 @@ TEST_F(FrontEndHelpTest, EveryKeyIsNamed) {
 
 TEST_F(FrontEndHelpTest, EveryCharacterThatDoesSomethingIsNamed) {
     const std::vector<std::string> names = namedKeys();
-    for (char character = ' '; character < 0x7F; ++character) {
-        TerminalStage fresh;
+    for (char character = '!'; character < 0x7F; ++character) {
+        Travel travel{{.timeline = [] { return nullptr; },
+                       .present = [] { return 0; },
+                       .now = [] { return Time(); },
+                       .steadyNow = [] { return std::chrono::steady_clock::time_point(); },
+                       .zone = [](Time) { return std::chrono::seconds(0); }}};
+        TerminalStage fresh(kUtf8Marks, &travel);
         fresh.tick(display());
         fresh.press(Key::Enter);
         fresh.press(Key::Down);

@@ -22,11 +22,11 @@ namespace pallax::terminal {
 /// the test sets, and counts the front end's requests to its surroundings.
 class TerminalStage final : public PaneApplication, public ui::NavigationDelegate {
 public:
-    explicit TerminalStage(const Marks& marks = kUtf8Marks)
+    explicit TerminalStage(const Marks& marks = kUtf8Marks, Travel* travel = nullptr)
         : frontEnd({[this] { ++displays; }, [this] { ++quits; },
                     [this](const std::string& text) { copied.push_back(text); },
                     [this] { ++repaints; }, [this] { ++startsAfresh; }, [this] { return zone; },
-                    [this] { return overview; }},
+                    [this] { return overview; }, travel},
                    marks),
           _window(frontEnd.toolkit().makeWindow({})) {
         auto root = std::make_shared<PallaxPaneController>(frontEnd.toolkit(), *this, nullptr, "/");

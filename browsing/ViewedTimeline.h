@@ -1,0 +1,55 @@
+#pragma once
+
+#include "host/BoundedJournal.h"
+#include "live/IndexingSlices.h"
+#include "live/LiveTimeline.h"
+#include "sources/Source.h"
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <string_view>
+
+namespace pallax {
+
+class BrowseLink;
+class RecordingJournal;
+
+/// What a viewer can go back to, and ahead: all of a recording that is one file, and otherwise the
+/// packets that have come.
+class ViewedTimeline {
+public:
+    /// The link must outlive the timeline.
+    struct Setup {
+        BrowseLink& link;
+        const Source& source;
+        BoundedJournal::Limits journal = {};
+        std::function<void()> indexed = [] {};
+        /// Called when the timeline is another one.
+        std::function<void()> replaced = [] {};
+    };
+
+    explicit ViewedTimeline(const Setup& setup);
+    ~ViewedTimeline();
+    ViewedTimeline(const ViewedTimeline&) = delete;
+    ViewedTimeline& operator=(const ViewedTimeline&) = delete;
+
+    /// The packets that follow are of the technology with this identifier; empty: not known yet.
+    void begin(std::string_view technology);
+    void add(Bytes packet, Time time);
+
+    /// Null before the first packet.
+    Timeline* timeline();
+    /// The latest instant that the source has reached.
+    std::uint64_t present();
+
+private:
+    BrowseLink& _link;
+    const RecordedTechnology* _technology = nullptr;
+    std::unique_ptr<RecordingJournal> _recording; ///< null if packets are kept as they come
+    std::unique_ptr<Timeline> _whole;             ///< of the recording
+    IndexingSlices _slices;
+    LiveTimeline _live;
+};
+
+} // namespace pallax

@@ -1,0 +1,45 @@
+#include "ui/terminal/ChangesPage.h"
+
+namespace pallax::terminal {
+
+namespace {
+
+constexpr std::string_view kNothingDiffers = "Nothing differs.";
+constexpr std::string_view kChangeArrow = "→";
+
+/// A line with an arrow of the marks.
+std::string withMarks(std::string line, const Marks& marks) {
+    const std::size_t arrow = marks.asciiOnly ? line.find(kChangeArrow) : std::string::npos;
+    return arrow == std::string::npos ? line : line.replace(arrow, kChangeArrow.size(), "->");
+}
+
+} // namespace
+
+PageAnswer ChangesPage::handle(const KeyEvent& event) {
+    const bool closes = event.key == Key::Character && event.character == U'd';
+    if (closes || goesBack(event)) {
+        return PageAnswer::Closes;
+    }
+    return _scrolling.handle(event) ? PageAnswer::Handled : PageAnswer::NotMine;
+}
+
+void ChangesPage::draw(const PageScreen& screen, const PageSurroundings& around) {
+    const Content& content = _source();
+    const PageFrame frame(screen, around, content.title);
+    const int lines = static_cast<int>(content.lines.size());
+    _scrolling.fit(frame.rows(), lines);
+    const int end = std::min(lines, _scrolling.first() + frame.rows());
+    for (int line = _scrolling.first(); line < end; ++line) {
+        const std::string text =
+            withMarks(content.lines[static_cast<std::size_t>(line)], screen.marks);
+        const bool isTitle = !text.starts_with(' ');
+        screen.grid.put(kMargin, kRowsAbove + line - _scrolling.first(), text, {.bold = isTitle},
+                        frame.span());
+    }
+    if (lines == 0) {
+        screen.grid.put(kMargin, kRowsAbove, kNothingDiffers, {}, frame.span());
+    }
+    frame.finish(_scrolling, lines, {{"d panes", typed(U'd')}, {"? help", typed(U'?')}});
+}
+
+} // namespace pallax::terminal

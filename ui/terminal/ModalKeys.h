@@ -1,0 +1,29 @@
+#pragma once
+
+#include "ui/terminal/Keys.h"
+#include "ui/terminal/ModalView.h"
+
+#include <functional>
+#include <utility>
+
+namespace pallax::terminal {
+
+/// The keys of a modal screen: of its list, its text field and its buttons.
+class ModalKeys {
+public:
+    explicit ModalKeys(std::function<void()> needsDisplay)
+        : _needsDisplay(std::move(needsDisplay)) {}
+
+    ModalFocus focus() const { return _focus; }
+    /// For the next screen to be opened.
+    void reset() { _focus = ModalFocus::Save; }
+    void handle(ui::ModalScreen& screen, const KeyEvent& event);
+
+private:
+    void handleButtons(ui::ModalScreen& screen, const KeyEvent& event);
+
+    std::function<void()> _needsDisplay;
+    ModalFocus _focus = ModalFocus::Save;
+};
+
+} // namespace pallax::terminal

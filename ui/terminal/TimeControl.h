@@ -1,0 +1,64 @@
+#pragma once
+
+#include "app/HeldPanes.h"
+#include "travel/Travel.h"
+#include "ui/terminal/Bars.h"
+#include "ui/terminal/ChangesPage.h"
+#include "ui/terminal/LineEditor.h"
+#include "ui/terminal/TerminalNavigation.h"
+
+#include <cstdint>
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace pallax::terminal {
+
+/// The keys that go back and forth in time, and the panes of the instant that they reach.
+class TimeControl {
+public:
+    /// `travel` may be null: there is only the present. It and the toolkit must outlive the object.
+    struct Surroundings {
+        Travel* travel;
+        ui::Toolkit& toolkit;
+        std::function<void(std::string)> say;
+        std::function<void()> needsDisplay;
+    };
+
+    explicit TimeControl(Surroundings surroundings) : _surroundings(std::move(surroundings)) {}
+
+    /// Handles its keys and, while a place to go to is typed, all; false for any other key.
+    bool handle(const KeyEvent& event);
+    bool isTyping() const { return _typed.has_value(); }
+    bool isAway() const { return travel() != nullptr && travel()->isAway(); }
+    bool isPlaying() const { return travel() != nullptr && travel()->isPlaying(); }
+    /// Plays on; true if another instant is shown now.
+    bool turn() { return isPlaying() && travel()->playOn(); }
+
+    /// The panes of the shown instant, which begin with those of `live`; null at the present.
+    TerminalNavigation* panes(const TerminalNavigation& live);
+    std::optional<Prompt> prompt() const;
+    std::optional<TimeBar> bar() const;
+    /// What has changed since the mark.
+    const ChangesPage::Content& changes();
+
+    bool hasMark() const { return travel() != nullptr && travel()->marked().has_value(); }
+
+private:
+    Travel* travel() const { return _surroundings.travel; }
+    void handleTyping(const KeyEvent& event);
+    std::optional<Travel::Refusal> act(char32_t character);
+    void tell(const Travel::Refusal& refusal);
+    Travel::Refusal setMark();
+    Travel::Refusal tellSpeed();
+
+    Surroundings _surroundings;
+    std::optional<LineEditor> _typed;
+    std::unique_ptr<HeldPanes> _panes;
+    std::uint64_t _paneInstant = 0; ///< that the panes show
+    ChangesPage::Content _changes;
+    std::optional<std::pair<std::uint64_t, std::uint64_t>> _compared; ///< whose changes are known
+};
+
+} // namespace pallax::terminal
