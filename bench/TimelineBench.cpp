@@ -2,7 +2,8 @@
 //
 // Prints one line for each figure, "NAME VALUE": the seconds of processor time until the index is
 // ready; those of reading all samples again; the 99th percentile and the greatest time of SEEKS
-// frames at random times and of as many displays at random packets; the greatest time for 1,000
+// frames at random times and of as many displays at random packets; those of steps by ticks from a
+// tenth as many packets; the greatest time for 1,000
 // buckets of a field over the whole recording; the peak resident size so far in MiB; and the
 // seconds of `decode --every end`.
 
@@ -14,7 +15,7 @@
 #include "host/BuildBundle.h"
 #include "host/DirectoryResources.h"
 #include "host/RecordingJournal.h"
-#include "timeline/Instants.h"
+#include "timeline/FrameWalk.h"
 #include "timeline/Series.h"
 
 #include <algorithm>
@@ -96,6 +97,28 @@ void measureSeeks(Timeline& timeline, long seeks) {
     printTimes("display", displays);
 }
 
+/// Some steps back and forward by ticks from a few random packets.
+void measureSteps(Timeline& timeline, long places) {
+    constexpr int kSteps = 10;
+    std::mt19937_64 random(1); // NOLINT(cert-msc32-c,cert-msc51-cpp): the same instants each time
+    std::uniform_int_distribution<std::uint64_t> packets(1, timeline.packets());
+    std::vector<double> seconds;
+    for (long place = 0; place < places; ++place) {
+        FrameWalk walk(timeline);
+        std::uint64_t instant = packets(random);
+        (void)walk.at(instant);
+        for (int step = 0; step < 2 * kSteps; ++step) {
+            seconds.push_back(secondsOf([&] {
+                const auto tick =
+                    step < kSteps ? tickBefore(timeline, instant) : tickAfter(timeline, instant);
+                instant = tick ? tick->packet : instant;
+                (void)walk.at(instant);
+            }));
+        }
+    }
+    printTimes("step", seconds);
+}
+
 void measureBuckets(Timeline& timeline) {
     constexpr std::size_t kBuckets = 1000;
     std::vector<double> seconds;
@@ -143,6 +166,7 @@ int main(int argc, char** argv) {
     CountingSink sink;
     print("read", secondsOf([&] { (void)timeline.read(1, timeline.packets(), sink); }));
     measureSeeks(timeline, seeks);
+    measureSteps(timeline, std::max(seeks / 10, 1L));
     measureBuckets(timeline);
     print("peak", peakMiB());
     print("packets", static_cast<double>(timeline.packets()));

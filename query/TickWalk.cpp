@@ -9,7 +9,7 @@
 namespace pallax {
 
 TickWalk::TickWalk(Timeline& timeline, const TimelineKeyFrame& from)
-    : _timeline(timeline), _replay(timeline.replayFrom(from)),
+    : _timeline(timeline), _replay(timeline.replayFrom(from.decoder, from.packet)),
       _reader(timeline.journal().reader(from.packet + 1)),
       _grid(from.grid), _now{.values = {timeline.fieldTable(), timeline.entryTable()}},
       _from(from.packet) {

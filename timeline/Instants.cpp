@@ -63,41 +63,6 @@ const TimelineKeyFrame* startOf(const Timeline& timeline, const Stretch& stretch
     return start;
 }
 
-FrameRef frameOf(Replay& replay, Time time, const FrameRef& before) {
-    const auto paths = std::make_shared<PathDictionary>();
-    NodeRef root = PallaxModelNode::makeTreeFromObject(replay.displayAt(time), *paths);
-    const SectionAges ages = replay.ages();
-    return std::make_shared<Frame>(Frame::Picture{std::move(root), paths, time}, before.get(),
-                                   &ages);
-}
-
-/// The replay at a later instant: decodes on, or from a key frame in between.
-std::unique_ptr<Replay> laterReplay(Timeline& timeline, std::unique_ptr<Replay> replay,
-                                    std::uint64_t instant) {
-    const TimelineKeyFrame* nearest = timeline.keyFrames().atOrBefore(instant);
-    if (nearest != nullptr && nearest->packet > replay->packet()) {
-        return timeline.replayAt(instant);
-    }
-    timeline.advance(*replay, instant);
-    return replay;
-}
-
-/// The frames of an instant and of the tick before it, if any.
-InstantFrame framesOf(Timeline& timeline, const std::optional<ShownTick>& before,
-                      std::uint64_t instant, Time time) {
-    InstantFrame made;
-    std::unique_ptr<Replay> replay;
-    if (before) {
-        replay = timeline.replayAt(before->packet);
-        made.before = frameOf(*replay, before->tick.time, nullptr);
-        replay = laterReplay(timeline, std::move(replay), instant);
-    } else {
-        replay = timeline.replayAt(instant);
-    }
-    made.frame = frameOf(*replay, time, made.before);
-    return made;
-}
-
 /// Calls `visit` (ShownTick -> whether to continue) with the two latest ticks of a key frame and
 /// with those after it.
 template <class Visit>
@@ -152,24 +117,33 @@ std::vector<ShownTick> ticksAt(Timeline& timeline, Time time) {
     return search.ticks();
 }
 
+FrameRef frameOf(Replay& replay, Time time, const FrameRef& before) {
+    const auto paths = std::make_shared<PathDictionary>();
+    NodeRef root = PallaxModelNode::makeTreeFromObject(replay.displayAt(time), *paths);
+    const SectionAges ages = replay.ages();
+    return std::make_shared<Frame>(Frame::Picture{std::move(root), paths, time}, before.get(),
+                                   &ages);
+}
+
 std::optional<TickFrame> frameAt(Timeline& timeline, Time time) {
     const std::vector<ShownTick> ticks = ticksAt(timeline, time);
     if (ticks.empty() || ticks.front().packet < timeline.firstInstant()) {
         return std::nullopt;
     }
-    const ShownTick& last = ticks.back();
-    InstantFrame made =
-        framesOf(timeline, ticks.size() == 2 ? std::optional(ticks.front()) : std::nullopt,
-                 last.packet, last.tick.time);
-    return TickFrame{std::move(made.frame), std::move(made.before), last.tick, last.packet};
-}
-
-std::optional<InstantFrame> frameAtInstant(Timeline& timeline, std::uint64_t instant) {
-    const std::optional<Time> time = timeOf(timeline, instant);
-    if (!time || instant == 0) {
-        return std::nullopt;
+    std::unique_ptr<Replay> replay = timeline.replayAt(ticks.front().packet);
+    TickFrame made{frameOf(*replay, ticks.front().tick.time, nullptr), nullptr, ticks.back().tick,
+                   ticks.back().packet};
+    if (ticks.size() == 2) {
+        const TimelineKeyFrame* nearest = timeline.keyFrames().atOrBefore(ticks.back().packet);
+        if (nearest != nullptr && nearest->packet > replay->packet()) {
+            replay = timeline.replayAt(ticks.back().packet);
+        } else {
+            timeline.advance(*replay, ticks.back().packet);
+        }
+        made.before = std::exchange(made.frame, nullptr);
+        made.frame = frameOf(*replay, ticks.back().tick.time, made.before);
     }
-    return framesOf(timeline, tickBefore(timeline, instant), instant, *time);
+    return made;
 }
 
 std::optional<Time> timeOf(Timeline& timeline, std::uint64_t instant) {

@@ -22,15 +22,8 @@ struct TickFrame {
 /// not worked out.
 std::optional<TickFrame> frameAt(Timeline& timeline, Time time);
 
-/// An instant's display, made again.
-struct InstantFrame {
-    FrameRef frame;
-    FrameRef before; ///< of the latest tick before the instant; null if there is none
-};
-
-/// The display at an instant, between the earliest and the latest, with the ages at its time.
-/// Nothing before the first packet.
-std::optional<InstantFrame> frameAtInstant(Timeline& timeline, std::uint64_t instant);
+/// The frame at a time after the packets that were decoded; `before` may be null.
+FrameRef frameOf(Replay& replay, Time time, const FrameRef& before);
 
 /// The time of an instant: the stamp of its packet, or that of the first packet before it. Nothing
 /// if the journal does not have it.

@@ -53,4 +53,11 @@ const TimelineKeyFrame* KeyFrames::atOrBefore(std::uint64_t packet) const {
     return after != _all.begin() ? &*std::prev(after) : nullptr;
 }
 
+const TimelineKeyFrame* KeyFrames::after(std::uint64_t packet) const {
+    const auto after = std::upper_bound(
+        _all.begin(), _all.end(), packet,
+        [](std::uint64_t number, const auto& each) { return number < each.packet; });
+    return after != _all.end() ? &*after : nullptr;
+}
+
 } // namespace pallax

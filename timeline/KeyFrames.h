@@ -52,6 +52,8 @@ public:
 
     /// The latest key frame that contains no packet after `packet`, or null.
     const TimelineKeyFrame* atOrBefore(std::uint64_t packet) const;
+    /// The earliest key frame after that of `packet`, or null.
+    const TimelineKeyFrame* after(std::uint64_t packet) const;
     const std::vector<TimelineKeyFrame>& all() const { return _all; }
 
 private:

@@ -123,14 +123,14 @@ std::unique_ptr<Replay> Timeline::replayAt(std::uint64_t instant) {
     if (from == nullptr) {
         throw std::out_of_range("the journal no longer has this instant");
     }
-    auto replay = replayFrom(*from);
+    auto replay = replayFrom(from->decoder, from->packet);
     advance(*replay, instant);
     return replay;
 }
 
-std::unique_ptr<Replay> Timeline::replayFrom(const TimelineKeyFrame& from) const {
+std::unique_ptr<Replay> Timeline::replayFrom(const KeyFrame& from, std::uint64_t packet) const {
     auto replay = std::make_unique<Replay>(_source);
-    replay->resume(from.decoder, from.packet);
+    replay->resume(from, packet);
     return replay;
 }
 

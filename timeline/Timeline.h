@@ -95,7 +95,7 @@ public:
     /// A decoder that has read the packets up to an instant.
     std::unique_ptr<Replay> replayAt(std::uint64_t instant);
     /// One that goes on after a key frame.
-    std::unique_ptr<Replay> replayFrom(const TimelineKeyFrame& from) const;
+    std::unique_ptr<Replay> replayFrom(const KeyFrame& from, std::uint64_t packet) const;
     /// Reads on to a later instant.
     void advance(Replay& replay, std::uint64_t instant, SampleSink* sink = nullptr);
 

@@ -3,6 +3,7 @@
 #include "decoding/RecordingDecoder.h"
 #include "tests/doubles/FakeStandardOutput.h"
 #include "tests/timeline/TimelineFixture.h"
+#include "timeline/FrameWalk.h"
 
 #include <string>
 
@@ -174,7 +175,7 @@ TEST_P(InstantsTest, TheTicksBesideAnInstantAreFoundWithoutDecodingAll) {
         };
         RC_ASSERT(same(tickBefore(*timeline, instant), before));
         RC_ASSERT(same(tickAfter(*timeline, instant), after));
-        const auto frame = frameAtInstant(*timeline, instant);
+        const auto frame = FrameWalk(*timeline).at(instant);
         RC_ASSERT(frame.has_value() == (instant != 0));
         if (frame) {
             RC_ASSERT(ShownTicks::treeText(timeline->displayAt(instant)) ==

@@ -1,7 +1,6 @@
 #include "ui/terminal/TimeControl.h"
 
 #include "overview/DifferenceText.h"
-#include "timeline/Instants.h"
 
 #include <utility>
 #include <vector>
@@ -126,6 +125,7 @@ std::optional<Prompt> TimeControl::prompt() const {
 TerminalNavigation* TimeControl::panes(const TerminalNavigation& live) {
     if (!isAway()) {
         _panes.reset();
+        _walk.reset();
         return nullptr;
     }
     const Moment moment = travel()->moment();
@@ -135,7 +135,11 @@ TerminalNavigation* TimeControl::panes(const TerminalNavigation& live) {
     }
     if (_paneInstant != moment.instant && moment.timeline != nullptr) {
         _paneInstant = moment.instant;
-        const auto frame = frameAtInstant(*moment.timeline, moment.instant);
+        if (!_walk || _walked != moment.timeline) {
+            _walked = moment.timeline;
+            _walk.emplace(*moment.timeline);
+        }
+        const auto frame = _walk->at(moment.instant);
         _panes->show(frame ? frame->frame : nullptr, frame ? frame->before : nullptr);
     }
     return &static_cast<TerminalNavigation&>(_panes->stack());

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "app/HeldPanes.h"
+#include "timeline/FrameWalk.h"
 #include "travel/Travel.h"
 #include "ui/terminal/Bars.h"
 #include "ui/terminal/ChangesPage.h"
@@ -57,6 +58,8 @@ private:
     std::optional<LineEditor> _typed;
     std::unique_ptr<HeldPanes> _panes;
     std::uint64_t _paneInstant = 0; ///< that the panes show
+    std::optional<FrameWalk> _walk; ///< while another instant than the present is shown
+    const Timeline* _walked = nullptr;
     ChangesPage::Content _changes;
     std::optional<std::pair<std::uint64_t, std::uint64_t>> _compared; ///< whose changes are known
 };
