@@ -35,7 +35,7 @@ class KeyFrames {
 public:
     struct Limits {
         std::uint64_t distance = 8192;                           ///< packets, at first
-        std::uint64_t distanceInBytes = std::uint64_t{1} << 21U; ///< of packets, at first
+        std::uint64_t distanceInBytes = std::uint64_t{1} << 19U; ///< of packets, at first
         std::size_t bytes = std::size_t{24} << 20U;              ///< of all key frames
         std::size_t count = 512;
     };
