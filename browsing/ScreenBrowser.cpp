@@ -26,6 +26,7 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
       _frontEnd(frontEndSurroundings(), terminal.marks()),
       _preferences(FilePreferences::userFolder()),
       _session(sessionSurroundings(std::move(source), settings)) {
+    _frontEnd.showListsAsTables(settings.lists == Lists::Table);
     if (settings.firstScreen == FirstScreen::Overview) {
         _frontEnd.openOverview();
     }
@@ -42,7 +43,8 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
                 },
             .startAfresh = [this] { _session.startAfresh(); },
             .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); },
-            .overview = [this] { return overview(); }};
+            .overview = [this] { return overview(); },
+            .entryPart = [this](const auto& path) { return entryPart(path); }};
 }
 
 BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource source,
@@ -75,6 +77,13 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource s
             .snapshotDirectory = settings.snapshotDirectory,
             .saveButtonMarker = settings.saveButtonMarker,
             .startsAfreshByItself = settings.afterReconnect == AfterReconnect::Fresh};
+}
+
+EntryPart ScreenBrowser::entryPart(const std::string& path) const {
+    if (_watch.namesCell(path)) {
+        return EntryPart::Cell;
+    }
+    return _watch.identifies(path) ? EntryPart::Identity : EntryPart::None;
 }
 
 Overview ScreenBrowser::overview() {

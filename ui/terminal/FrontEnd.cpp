@@ -1,5 +1,6 @@
 #include "ui/terminal/FrontEnd.h"
 
+#include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/Overlays.h"
 #include "ui/terminal/PaneView.h"
 
@@ -15,7 +16,9 @@ constexpr int kScrollColumns = 8; // per key, in a row that does not fit
 } // namespace
 
 FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
-    : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }) {}
+    : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }) {
+    _toolkit.lists().partAt = _surroundings.entryPart;
+}
 
 /// Click areas may be out of date until the next drawing.
 void FrontEnd::needsDisplay() {
@@ -136,7 +139,8 @@ void FrontEnd::handle(const KeyEvent& event) {
                event.key == Key::WheelDown) {
         handleMouse(event);
     } else if (modal) {
-        handleModal(*modal, event);
+        handleModalKey(*modal, _modalFocus, event);
+        needsDisplay();
     } else if (_filterEditor) {
         handleFilter(*table(), event);
     } else {
@@ -158,6 +162,7 @@ void FrontEnd::handleMouse(const KeyEvent& event) {
     // A copy, because the action may change the screen.
     if (const HitMap::Action action = _hits.at(event.x, event.y)) {
         action();
+        needsDisplay();
     }
 }
 
@@ -167,45 +172,6 @@ void FrontEnd::handleAlert(const KeyEvent& event) {
         (event.key == Key::Character && (event.character == U' ' || event.character == U'q'));
     if (closes) {
         _toolkit.closeAlert();
-    }
-}
-
-void FrontEnd::handleModal(ui::ModalScreen& screen, const KeyEvent& event) {
-    TerminalTextField& field = terminalTextField(screen.field());
-    if (event.key == Key::Escape) {
-        if (field.isEditing() && !field.text().empty()) {
-            field.resignFirstResponder(); // so one key does not discard the typed text
-        } else {
-            screen.cancelPressed();
-        }
-        return;
-    }
-    if (event.key == Key::PageUp || event.key == Key::PageDown) {
-        TerminalTable& list = terminalTable(screen.list());
-        list.scroll(event.key == Key::PageUp ? -list.page() : list.page());
-        return;
-    }
-    const bool forwards = event.key == Key::Tab || event.key == Key::Down;
-    const bool backwards = event.key == Key::BackTab || event.key == Key::Up;
-    if (field.isEditing()) {
-        if (forwards || backwards) {
-            _modalFocus = forwards ? ModalFocus::Save : ModalFocus::Cancel;
-            field.resignFirstResponder();
-        } else if (field.handle(event) && !field.isEditing()) {
-            _modalFocus = ModalFocus::Save; // after the return key
-        }
-        return;
-    }
-    if (event.key == Key::Enter || (event.key == Key::Character && event.character == U' ')) {
-        _modalFocus == ModalFocus::Save ? screen.savePressed() : screen.cancelPressed();
-        return;
-    }
-    const bool isSave = _modalFocus == ModalFocus::Save;
-    if ((forwards && !isSave) || (backwards && isSave)) {
-        field.beginEditing();
-    } else if (forwards || backwards || event.key == Key::Left || event.key == Key::Right) {
-        _modalFocus = isSave ? ModalFocus::Cancel : ModalFocus::Save;
-        needsDisplay();
     }
 }
 
@@ -300,7 +266,7 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return _toolkit.navigation()->isAtRoot() ? _surroundings.quit()
                                                  : _toolkit.navigation()->back();
     default:
-        return;
+        return pane.handleListKey(character);
     }
 }
 
@@ -333,7 +299,7 @@ void FrontEnd::openOrScroll(TerminalTable& table, bool mayScroll) {
     if (mayScroll && table.scrollSideways(kScrollColumns)) {
         return;
     }
-    if (const auto row = table.pane().cursorRow()) {
+    if (const auto row = table.selectedRow()) {
         table.source().didSelectRow(row);
     }
 }
@@ -345,7 +311,7 @@ void FrontEnd::goBack(TerminalTable& table) {
 }
 
 void FrontEnd::escape(TerminalTable& table) {
-    if (table.pane().filter().empty()) {
+    if (table.filter().empty()) {
         _toolkit.navigation()->back();
     } else {
         table.setFilter("");
@@ -366,7 +332,7 @@ void FrontEnd::save() {
 }
 
 void FrontEnd::copyValue(TerminalTable& table) {
-    if (const auto copied = table.pane().copied()) {
+    if (const auto copied = table.copied()) {
         _surroundings.copy(*copied);
         setMessage("Copied: " + *copied);
     }
@@ -374,7 +340,7 @@ void FrontEnd::copyValue(TerminalTable& table) {
 
 void FrontEnd::startFilter(TerminalTable& table) {
     LineEditor editor;
-    editor.setText(table.pane().filter());
+    editor.setText(table.filter());
     _filterEditor = std::move(editor);
     _filteredPane = _toolkit.navigation()->screens().back();
     needsDisplay();

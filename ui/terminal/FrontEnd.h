@@ -34,6 +34,8 @@ public:
         std::function<std::string()> zone = [] { return std::string(); };
         /// What the overview shows now.
         std::function<Overview()> overview = [] { return Overview(); };
+        /// The part of a field in telling entries of its list apart.
+        EntryPartAt entryPart = ListLook().partAt;
     };
 
     FrontEnd(Surroundings surroundings, const Marks& marks);
@@ -47,6 +49,9 @@ public:
 
     /// Shows the overview over the panes, as its key does.
     void openOverview();
+
+    /// Whether lists open as tables, until the user chooses otherwise.
+    void showListsAsTables(bool asTables) { _toolkit.lists().asTables = asTables; }
 
     /// Replaces the status text until the next key.
     void setMessage(std::string message);
@@ -68,7 +73,6 @@ private:
     void drawScreen(Grid& grid, TerminalNavigation& navigation);
     void handleMouse(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
-    void handleModal(ui::ModalScreen& screen, const KeyEvent& event);
     void handlePage(const KeyEvent& event);
     void handleFilter(TerminalTable& table, const KeyEvent& event);
     void handlePane(const KeyEvent& event);

@@ -15,6 +15,8 @@ constexpr auto kKeyHelp = std::to_array<KeyHelp>({
     {"Left h Backspace", "back"},
     {"Esc", "clear the filter, or back"},
     {"/", "filter rows by name or value"},
+    {"t", "a list as a table or as rows"},
+    {"< > r  x X", "sort a table; hide columns"},
     {"o", "overview of the radio"},
     {"s", "save a snapshot"},
     {"y", "copy the value"},

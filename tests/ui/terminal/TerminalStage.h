@@ -26,7 +26,8 @@ public:
         : frontEnd({[this] { ++displays; }, [this] { ++quits; },
                     [this](const std::string& text) { copied.push_back(text); },
                     [this] { ++repaints; }, [this] { ++startsAfresh; }, [this] { return zone; },
-                    [this] { return overview; }},
+                    [this] { return overview; },
+                    [this](const std::string& path) { return entryPart(path); }},
                    marks),
           _window(frontEnd.toolkit().makeWindow({})) {
         auto root = std::make_shared<PallaxPaneController>(frontEnd.toolkit(), *this, nullptr, "/");
@@ -45,6 +46,7 @@ public:
     std::string zone; ///< of the status text's time
     std::vector<std::string> copied;
     Overview overview; ///< what the overview shows
+    EntryPartAt entryPart = ListLook().partAt;
 
     bool savingAllowed = true;
     std::optional<std::string> status; ///< null: follows the connection
