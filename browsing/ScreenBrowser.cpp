@@ -44,7 +44,8 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
             .startAfresh = [this] { _session.startAfresh(); },
             .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); },
             .overview = [this] { return overview(); },
-            .entryPart = [this](const auto& path) { return entryPart(path); }};
+            .entryPart = [this](const auto& path) { return entryPart(path); },
+            .ahead = [this] { return _link.clock().zone(_link.clock().now()).offset; }};
 }
 
 BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource source,

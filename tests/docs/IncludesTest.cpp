@@ -67,7 +67,7 @@ const std::vector<Layer>& layers() {
         {"host", {"text", "plist", "platform", "packets", "knowledge"}},
         {"ui/terminal",
          {"text", "plist", "platform", "platform/ui", "app/tree", "app/pane", "app/table",
-          "overview"}},
+          "fields", "timeline", "overview"}},
         {"simulator", {"text", "plist", "platform", "packets", "host"}},
         {"sources",
          {"text", "plist", "platform", "packets", records, generators, "host", "simulator"}},

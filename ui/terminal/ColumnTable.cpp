@@ -12,6 +12,7 @@ namespace {
 
 constexpr int kLeft = 1;      // after the cursor's mark
 constexpr int kColumnGap = 2; // the first of them is for a mark
+constexpr int kLeastOfText = 8;
 constexpr int kMostHeadingRows = 2;
 constexpr int kRowsForTwoHeadingRows = 6;
 
@@ -234,11 +235,17 @@ std::vector<ColumnTable::Place> ColumnTable::places() const {
             continue;
         }
         const int width = widthOf(columns[index]);
-        const bool mayBeCut = index <= fixed + scrolled;
-        if (!mayBeCut && x + width > _columns - 1) {
+        const bool isFirst = index <= fixed + scrolled;
+        const bool isWhole = isFirst || x + width <= _columns - 1;
+        // The beginning of a text is worth showing, that of a number is not.
+        const bool isText = !_measured[columns[index]].isRight;
+        if (!isWhole && !(isText && x + kLeastOfText <= _columns - 1)) {
             break;
         }
-        made.push_back({columns[index], x, width, headingOf(columns[index])});
+        made.push_back({columns[index], x, width, headingOf(columns[index]), isWhole});
+        if (!isWhole) {
+            break;
+        }
         x += width + kColumnGap;
     }
     return made;
@@ -246,8 +253,9 @@ std::vector<ColumnTable::Place> ColumnTable::places() const {
 
 bool ColumnTable::shows(std::size_t column) const {
     const std::vector<Place> shown = places();
-    return std::any_of(shown.begin(), shown.end(),
-                       [column](const Place& place) { return place.column == column; });
+    return std::any_of(shown.begin(), shown.end(), [column](const Place& place) {
+        return place.column == column && place.isWhole;
+    });
 }
 
 void ColumnTable::revealChosen() {
@@ -315,16 +323,17 @@ void ColumnTable::drawHeadings(const Brush& brush, const std::vector<Place>& pla
         const bool isChosen = _model.chosenColumn() == place.column;
         const Style style{.bold = isChosen, .dim = !isChosen};
         const Span clip{place.x, std::min(place.x + place.width, _columns - 1)};
+        const bool isRight = _measured[place.column].isRight;
         const int blank = rows - static_cast<int>(place.heading.size());
         for (int line = blank; line < rows; ++line) {
             const std::string& text = place.heading[static_cast<std::size_t>(line - blank)];
-            const bool isRight = _measured[place.column].isRight;
             const int x = isRight ? place.x + place.width - columnsOf(text) : place.x;
             brush.grid.put(x, top + line, text, style, clip);
         }
         if (isChosen) {
             const auto mark = _model.isDescending() ? brush.marks.down : brush.marks.up;
-            brush.grid.put(clip.right, top + rows - 1, mark, style);
+            const int end = isRight ? place.width : columnsOf(place.heading.back());
+            brush.grid.put(std::min(place.x + end, clip.right), top + rows - 1, mark, style);
         }
         brush.hits.add(place.x, top, place.width + 1, rows, [this, column = place.column] {
             _model.chosenColumn() == column ? _model.reverse() : _model.choose(column);

@@ -55,6 +55,7 @@ private:
         int x;
         int width;
         std::vector<std::string> heading;
+        bool isWhole; ///< or as much of it as can be shown at all
     };
     struct Brush;
 
@@ -64,7 +65,7 @@ private:
     /// The identity columns that are not scrolled: as many as leave room for others.
     std::size_t fixedColumns(const std::vector<std::size_t>& columns) const;
     std::vector<Place> places() const;
-    /// Whether a column is in the window; the first scrolled one may be cut.
+    /// Whether a column is wholly in the window.
     bool shows(std::size_t column) const;
     void revealChosen();
     int headingRows() const;

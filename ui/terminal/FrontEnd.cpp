@@ -79,6 +79,12 @@ void FrontEnd::openOverview() {
     needsDisplay();
 }
 
+void FrontEnd::openEvents() {
+    _pages.open(EventsPage({_surroundings.moment, _surroundings.goTo, _surroundings.ahead,
+                            [this](const std::string& text) { copy(text); }}));
+    needsDisplay();
+}
+
 void FrontEnd::setMessage(std::string message) {
     _message = std::move(message);
     needsDisplay();
@@ -253,6 +259,8 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return startFilter(pane);
     case U'o':
         return openOverview();
+    case U'e':
+        return openEvents();
     case U's':
         return save();
     case U'y':
@@ -333,9 +341,13 @@ void FrontEnd::save() {
 
 void FrontEnd::copyValue(TerminalTable& table) {
     if (const auto copied = table.copied()) {
-        _surroundings.copy(*copied);
-        setMessage("Copied: " + *copied);
+        copy(*copied);
     }
+}
+
+void FrontEnd::copy(const std::string& text) {
+    _surroundings.copy(text);
+    setMessage("Copied: " + text);
 }
 
 void FrontEnd::startFilter(TerminalTable& table) {

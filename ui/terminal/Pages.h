@@ -1,5 +1,6 @@
 #pragma once
 
+#include "ui/terminal/EventsPage.h"
 #include "ui/terminal/OverviewPage.h"
 
 #include <variant>
@@ -7,7 +8,7 @@
 
 namespace pallax::terminal {
 
-using Page = std::variant<OverviewPage>;
+using Page = std::variant<OverviewPage, EventsPage>;
 
 /// The pages over the panes, the last one on top. They are not on the navigation stack, whose panes
 /// are updated meanwhile.

@@ -1,7 +1,7 @@
 #include "ui/terminal/PaneView.h"
 
-#include "ui/terminal/LineEditor.h"
 #include "ui/terminal/MarkedText.h"
+#include "ui/terminal/Prompt.h"
 #include "ui/terminal/TerminalToolkit.h"
 #include "ui/terminal/TextWidth.h"
 
@@ -73,7 +73,7 @@ void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
     const int ruleRight =
         bars.drawRule(_grid.rows() - kRowsBelow, _marks.down, table.rowsBelow(), Key::PageDown);
     if (status.filterEditor != nullptr) {
-        drawFilterPrompt(*status.filterEditor, bars);
+        drawPrompt(_grid, bars, "/", *status.filterEditor, kClearFilter);
     } else if (navigation.isToolbarShown()) {
         const ui::BarItems& items = navigation.top().toolbarItems();
         drawHints(items, table, bars.drawStatus(items, ruleRight), bars);
@@ -204,22 +204,6 @@ void PaneView::drawHints(const ui::BarItems& items, TerminalTable& table, int fr
     }
     hints.push_back({"? help", typed(U'?')});
     bars.drawHints(hints, from);
-}
-
-void PaneView::drawFilterPrompt(const LineEditor& editor, Bars& bars) {
-    const int y = _grid.rows() - 1;
-    const int start = kMargin + 2; // after "/ "
-    const int cursor = columnsOf(std::string_view(editor.text()).substr(0, editor.cursor()));
-    const int last = _grid.columns() - 1 - kMargin;
-    // A long text is scrolled so that the cursor stays visible.
-    const int offset = std::max(start + cursor - last, 0);
-    _grid.put(kMargin, y, "/", kBold);
-    const int end = _grid.put(start - offset, y, editor.text(), {}, {start, last});
-    _grid.setCursor({start + cursor - offset, y});
-    const int left = _grid.columns() - kMargin - columnsOf(kClearFilter.text);
-    if (left > end + 1) {
-        bars.drawHint(left, kClearFilter.text, kClearFilter.key);
-    }
 }
 
 } // namespace pallax::terminal

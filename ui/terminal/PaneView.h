@@ -26,7 +26,6 @@ private:
     void drawRow(TerminalTable& table, std::size_t shown, int y);
     void drawCell(const TerminalTable& table, ui::TableCell& cell, const PaneRow& row, int y,
                   bool isSelected);
-    void drawFilterPrompt(const LineEditor& editor, Bars& bars);
     void drawHints(const ui::BarItems& items, TerminalTable& table, int from, Bars& bars);
 
     Grid& _grid;
