@@ -38,6 +38,7 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                  .replaced = [this] { _travel.reset(); }}),
       _travel(travelSurroundings()), _frontEnd(frontEndSurroundings(), terminal.marks()),
       _preferences(FilePreferences::userFolder()), _session(sessionSurroundings(source, settings)) {
+    _frontEnd.showListsAsTables(settings.lists == Lists::Table);
     if (settings.firstScreen == FirstScreen::Overview) {
         _frontEnd.openOverview();
     }
@@ -55,6 +56,16 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
             .startAfresh = [this] { _session.startAfresh(); },
             .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); },
             .overview = [this] { return overview(); },
+            .entryPart = [this](const auto& path) { return entryPart(path); },
+            .moment = [this] { return _travel.moment(); },
+            .goTo =
+                [this](std::uint64_t packet) {
+                    if (const auto refusal = _travel.toInstant(packet)) {
+                        _frontEnd.setMessage(*refusal);
+                    }
+                    needsDisplay();
+                },
+            .ahead = [this] { return _link.clock().zone(_link.clock().now()).offset; },
             .travel = &_travel};
 }
 
@@ -121,6 +132,13 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(const Source& s
             .snapshotDirectory = settings.snapshotDirectory,
             .saveButtonMarker = settings.saveButtonMarker,
             .startsAfreshByItself = settings.afterReconnect == AfterReconnect::Fresh};
+}
+
+EntryPart ScreenBrowser::entryPart(const std::string& path) const {
+    if (_watch.namesCell(path)) {
+        return EntryPart::Cell;
+    }
+    return _watch.identifies(path) ? EntryPart::Identity : EntryPart::None;
 }
 
 Overview ScreenBrowser::overview() {

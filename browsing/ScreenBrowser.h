@@ -46,6 +46,7 @@ private:
     void keepTurning();
     void adoptSize();
     Overview overview();
+    EntryPart entryPart(const std::string& path) const;
 
     bool _isDisplayPosted = false;
     terminal::CursesTerminal& _terminal;

@@ -65,6 +65,10 @@ constexpr std::array kChoiceSettings{
                       settings.firstScreen =
                           isOverview ? FirstScreen::Overview : FirstScreen::Panes;
                   }},
+    ChoiceSetting{"lists", "rows", "table",
+                  [](Settings& settings, bool isTable) {
+                      settings.lists = isTable ? Lists::Table : Lists::Rows;
+                  }},
 };
 
 std::optional<std::string> takeChoice(Settings& settings, const ChoiceSetting& setting,

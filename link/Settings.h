@@ -19,12 +19,16 @@ enum class AfterReconnect { Keep, Fresh };
 /// The screen that a viewer opens with.
 enum class FirstScreen { Panes, Overview };
 
+/// How lists of the display are shown.
+enum class Lists { Rows, Table };
+
 /// The contents of the settings file; without one, the defaults. Lines are `key = value`, empty, or
 /// a comment from "#" on its own line.
 struct Settings {
     AfterReconnect afterReconnect = AfterReconnect::Keep; ///< after-reconnect = keep | fresh
     OnFatalRecord onFatalRecord = OnFatalRecord::Stop;    ///< on-fatal-record = stop | skip
     FirstScreen firstScreen = FirstScreen::Panes;         ///< first-screen = panes | overview
+    Lists lists = Lists::Rows;                            ///< lists = rows | table
     std::optional<std::string> snapshotDirectory;         ///< snapshot-directory = PATH
     std::optional<std::string> saveButtonMarker;          ///< save-button-marker = PATH
     int systemLogLevel = kSyslogLevel;                    ///< system-log-level = 0 ... 7

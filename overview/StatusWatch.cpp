@@ -1,5 +1,6 @@
 #include "overview/StatusWatch.h"
 
+#include "fields/CellFields.h"
 #include "platform/RecordedTechnology.h"
 #include "timeline/Instants.h"
 
@@ -35,6 +36,19 @@ void StatusWatch::begin(std::string_view technology) {
         _known = std::make_unique<Known>(*known, _resources);
         _known->values.setListener(this);
     }
+}
+
+bool StatusWatch::identifies(const std::string& path) const {
+    const auto field = _known ? _known->fields.atPath(path) : std::nullopt;
+    return field && _known->fields.identifies(*field);
+}
+
+bool StatusWatch::namesCell(const std::string& path) const {
+    const auto field = _known ? _known->fields.atPath(path) : std::nullopt;
+    const auto cells = cellFields();
+    return field && std::any_of(cells.begin(), cells.end(), [&](const CellFields& cell) {
+               return cell.code == _known->fields[*field].name;
+           });
 }
 
 Overview StatusWatch::overview(Time time, const NetworkNames& names,

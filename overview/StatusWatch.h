@@ -7,6 +7,7 @@
 #include "timeline/Moment.h"
 
 #include <memory>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -38,6 +39,11 @@ public:
     /// Forgets everything. The samples that follow are of the technology with this identifier
     /// ("Zorell_LTE"); of an unknown technology, they are dropped. Not during a packet.
     void begin(std::string_view technology);
+
+    /// Whether a field of a list is part of the identity of its entries, and whether it tells which
+    /// cell an entry is, by its path in the display: "/Neighbor Cells List/*/Physical Cell ID".
+    bool identifies(const std::string& path) const;
+    bool namesCell(const std::string& path) const;
 
     Overview overview(Time time, const NetworkNames& names, const QualityProfile& profile) const;
 

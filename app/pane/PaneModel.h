@@ -23,6 +23,8 @@ public:
     /// `node` may be null: no data yet.
     PaneModel(NodeRef node, std::string path);
 
+    /// The node whose children are the rows; may be null.
+    const NodeRef& node() const { return _node; }
     /// The node's name, or "Pallax" without a node.
     std::string title() const;
     /// The node's path in the display tree; "/" for the root.

@@ -62,5 +62,20 @@ TEST_F(EndToEndScreen, TheOverviewIsTheFirstScreenIfTheSettingsSaySo) {
     EXPECT_EQ(terminal.wait(), 0);
 }
 
+TEST_F(EndToEndScreen, ListsAreTablesIfTheSettingsSaySo) {
+    std::ofstream(world.path("config/pallax/pallax.conf")) << "lists = table\n";
+    PallaxTerminal terminal(world, {lteDrive(), "--speed", "max"}, {});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    terminal.type("/list\r\r");
+    ASSERT_TRUE(terminal.shows("Pallax › Neighbor Cells List"));
+    EXPECT_TRUE(terminal.shows("2 cells"));
+    EXPECT_TRUE(terminal.shows("▌     184    -64.00"));
+    terminal.type("t");
+    EXPECT_TRUE(terminal.shows("▌0"));
+    terminal.type("tq");
+    terminal.type("q");
+    EXPECT_EQ(terminal.wait(), 0);
+}
+
 } // namespace
 } // namespace pallax

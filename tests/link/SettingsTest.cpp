@@ -26,6 +26,7 @@ TEST(Settings, AreReadLineByLine) {
                                         "system-log-level = 4\n"
                                         "after-reconnect = fresh\n"
                                         "first-screen = overview\n"
+                                        "lists = table\n"
                                         "journal-hours = 2\n"
                                         "journal-mebibytes = 65536\n"
                                         "save-button-marker = /tmp/marker",
@@ -37,12 +38,14 @@ TEST(Settings, AreReadLineByLine) {
     EXPECT_EQ(settings->systemLogLevel, 4);
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Fresh);
     EXPECT_EQ(settings->firstScreen, FirstScreen::Overview);
+    EXPECT_EQ(settings->lists, Lists::Table);
     EXPECT_EQ(settings->journal.age, std::chrono::hours(2));
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{64} << 30U);
     EXPECT_EQ(parseSettings("after-reconnect = keep", "pallax.conf")->afterReconnect,
               AfterReconnect::Keep);
     EXPECT_EQ(parseSettings("first-screen = panes", "pallax.conf")->firstScreen,
               FirstScreen::Panes);
+    EXPECT_EQ(parseSettings("lists = rows", "pallax.conf")->lists, Lists::Rows);
 }
 
 TEST(Settings, WithoutAFileTheDefaultsHold) {
@@ -54,6 +57,7 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
     EXPECT_EQ(settings->systemLogLevel, 3);
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Keep);
     EXPECT_EQ(settings->firstScreen, FirstScreen::Panes);
+    EXPECT_EQ(settings->lists, Lists::Rows);
     EXPECT_EQ(settings->journal.age, std::chrono::hours(24));
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{256} << 20U);
 }
@@ -67,6 +71,8 @@ TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
               "pallax.conf, line 1: after-reconnect is \"keep\" or \"fresh\", not \"never\".");
     EXPECT_EQ(sentenceFor("first-screen = graph"),
               "pallax.conf, line 1: first-screen is \"panes\" or \"overview\", not \"graph\".");
+    EXPECT_EQ(sentenceFor("lists = grid"),
+              "pallax.conf, line 1: lists is \"rows\" or \"table\", not \"grid\".");
     EXPECT_EQ(sentenceFor("snapshot-directory ="),
               "pallax.conf, line 1: snapshot-directory needs a path.");
     for (const char* level : {"8", "-1", "4x", "", "warning", "99999999999"}) {

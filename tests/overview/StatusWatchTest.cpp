@@ -113,5 +113,21 @@ TEST(StatusWatch, DoesNotTellATimeAcrossAGap) {
     EXPECT_EQ(first->words.find(" after "), std::string::npos) << first->words;
 }
 
+TEST(StatusWatchTest, FieldsTellWhichEntryOfAListIsWhich) {
+    const Watched lte("lte");
+    const std::string list = "/Neighbor Cells List/*/";
+    EXPECT_TRUE(lte.watch.identifies(list + "Physical Cell ID"));
+    EXPECT_TRUE(lte.watch.namesCell(list + "Physical Cell ID"));
+    EXPECT_FALSE(lte.watch.identifies(list + "Measured RSRP"));
+    EXPECT_FALSE(lte.watch.namesCell(list + "Measured RSRP"));
+    EXPECT_FALSE(lte.watch.identifies(list + "No field"));
+    const std::string candidates = "/Reselection Candidates List/*/";
+    EXPECT_TRUE(lte.watch.identifies(candidates + "U ARFCN"));
+    EXPECT_FALSE(lte.watch.namesCell(candidates + "U ARFCN")) << "a channel has many cells";
+    StatusWatch none{lte.resources};
+    EXPECT_FALSE(none.identifies(list + "Physical Cell ID"));
+    EXPECT_FALSE(none.namesCell(list + "Physical Cell ID"));
+}
+
 } // namespace
 } // namespace pallax

@@ -38,6 +38,8 @@ TEST_F(FirstSettings, AreWrittenOnceAndTheSnapshotFolderIsMade) {
     EXPECT_EQ(settings->saveButtonMarker, snapshots);
     EXPECT_EQ(settings->onFatalRecord, OnFatalRecord::Stop);
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Fresh);
+    EXPECT_EQ(settings->firstScreen, FirstScreen::Overview);
+    EXPECT_EQ(settings->lists, Lists::Table);
     EXPECT_EQ(contentOf(folder.path("err")),
               "Settings were written to " + file + "; snapshots go to " + snapshots + ".\n");
 

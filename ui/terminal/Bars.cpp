@@ -1,6 +1,6 @@
 #include "ui/terminal/Bars.h"
 
-#include "ui/terminal/LineEditor.h"
+#include "ui/terminal/Prompt.h"
 #include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
@@ -114,7 +114,8 @@ int Bars::drawStatus(const ui::BarItems& items, int ruleRight) {
 
 void Bars::drawLastRow(const ui::BarItems& items, int ruleRight, const std::vector<Hint>& hints) {
     if (_status.prompt) {
-        return drawPrompt(*_status.prompt);
+        return drawPrompt(_grid, *this, _status.prompt->mark, *_status.prompt->editor,
+                          _status.prompt->hint);
     }
     if (!_status.timeBar || _status.message) {
         return drawHints(hints, drawStatus(items, ruleRight));
@@ -126,23 +127,6 @@ void Bars::drawLastRow(const ui::BarItems& items, int ruleRight, const std::vect
                {"$ present", typed(U'$')},
                {"? help", typed(U'?')}},
               drawTimeBar(*_status.timeBar));
-}
-
-void Bars::drawPrompt(const Prompt& prompt) {
-    const LineEditor& editor = *prompt.editor;
-    const int y = _grid.rows() - 1;
-    const int start = kMargin + columnsOf(prompt.mark) + 1;
-    const int cursor = columnsOf(std::string_view(editor.text()).substr(0, editor.cursor()));
-    const int last = _grid.columns() - 1 - kMargin;
-    // A long text is scrolled so that the cursor stays visible.
-    const int offset = std::max(start + cursor - last, 0);
-    _grid.put(kMargin, y, prompt.mark, {.bold = true});
-    const int end = _grid.put(start - offset, y, editor.text(), {}, {start, last});
-    _grid.setCursor({start + cursor - offset, y});
-    const int left = _grid.columns() - kMargin - columnsOf(prompt.hint.text);
-    if (left > end + 1) {
-        drawHint(left, prompt.hint.text, prompt.hint.key);
-    }
 }
 
 /// Returns the column after the bar and its clock.

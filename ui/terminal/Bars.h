@@ -94,7 +94,6 @@ public:
 
 private:
     int drawCutInFront(int x, int y, std::string_view text);
-    void drawPrompt(const Prompt& prompt);
     int drawTimeBar(const TimeBar& bar);
 
     Grid& _grid;

@@ -1,5 +1,6 @@
 #include "ui/terminal/FrontEnd.h"
 
+#include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/Overlays.h"
 #include "ui/terminal/PaneView.h"
 
@@ -19,7 +20,9 @@ FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
       _modalKeys([this] { needsDisplay(); }),
       _time({_surroundings.travel, _toolkit,
              [this](std::string text) { setMessage(std::move(text)); },
-             [this] { needsDisplay(); }}) {}
+             [this] { needsDisplay(); }}) {
+    _toolkit.lists().partAt = _surroundings.entryPart;
+}
 
 /// Click areas may be out of date until the next drawing.
 void FrontEnd::needsDisplay() {
@@ -85,6 +88,12 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
 
 void FrontEnd::openOverview() {
     _pages.open(OverviewPage(_surroundings.overview));
+    needsDisplay();
+}
+
+void FrontEnd::openEvents() {
+    _pages.open(EventsPage({_surroundings.moment, _surroundings.goTo, _surroundings.ahead,
+                            [this](const std::string& text) { copy(text); }}));
     needsDisplay();
 }
 
@@ -175,6 +184,7 @@ void FrontEnd::handleMouse(const KeyEvent& event) {
     // A copy, because the action may change the screen.
     if (const HitMap::Action action = _hits.at(event.x, event.y)) {
         action();
+        needsDisplay();
     }
 }
 
@@ -286,6 +296,8 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return startFilter(pane);
     case U'o':
         return openOverview();
+    case U'e':
+        return openEvents();
     case U's':
         return save();
     case U'y':
@@ -298,7 +310,7 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
     case U'q':
         return navigation()->isAtRoot() ? _surroundings.quit() : navigation()->back();
     default:
-        return;
+        return pane.handleListKey(character);
     }
 }
 
@@ -331,7 +343,7 @@ void FrontEnd::openOrScroll(TerminalTable& table, bool mayScroll) {
     if (mayScroll && table.scrollSideways(kScrollColumns)) {
         return;
     }
-    if (const auto row = table.pane().cursorRow()) {
+    if (const auto row = table.selectedRow()) {
         table.source().didSelectRow(row);
     }
 }
@@ -343,7 +355,7 @@ void FrontEnd::goBack(TerminalTable& table) {
 }
 
 void FrontEnd::escape(TerminalTable& table) {
-    if (table.pane().filter().empty()) {
+    if (table.filter().empty()) {
         navigation()->back();
     } else {
         table.setFilter("");
@@ -367,15 +379,19 @@ void FrontEnd::save() {
 }
 
 void FrontEnd::copyValue(TerminalTable& table) {
-    if (const auto copied = table.pane().copied()) {
-        _surroundings.copy(*copied);
-        setMessage("Copied: " + *copied);
+    if (const auto copied = table.copied()) {
+        copy(*copied);
     }
+}
+
+void FrontEnd::copy(const std::string& text) {
+    _surroundings.copy(text);
+    setMessage("Copied: " + text);
 }
 
 void FrontEnd::startFilter(TerminalTable& table) {
     LineEditor editor;
-    editor.setText(table.pane().filter());
+    editor.setText(table.filter());
     _filterEditor = std::move(editor);
     _filteredPane = navigation()->screens().back();
     needsDisplay();

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "timeline/Moment.h"
 #include "ui/terminal/Grid.h"
 #include "ui/terminal/HelpPage.h"
 #include "ui/terminal/HitMap.h"
@@ -12,6 +13,8 @@
 #include "ui/terminal/TerminalToolkit.h"
 #include "ui/terminal/TimeControl.h"
 
+#include <chrono>
+#include <cstdint>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -35,6 +38,14 @@ public:
         std::function<std::string()> zone = [] { return std::string(); };
         /// What the overview shows now.
         std::function<Overview()> overview = [] { return Overview(); };
+        /// The part of a field in telling entries of its list apart.
+        EntryPartAt entryPart = ListLook().partAt;
+        /// The instant that is shown.
+        std::function<Moment()> moment = [] { return Moment(); };
+        /// Shows the instant of a packet.
+        std::function<void(std::uint64_t packet)> goTo = [](std::uint64_t /*packet*/) {};
+        /// Local time minus UTC, for times of day.
+        std::function<std::chrono::seconds()> ahead = [] { return std::chrono::seconds(0); };
         /// Goes back in time; null if there is only the present. Must outlive the front end.
         Travel* travel = nullptr;
     };
@@ -50,6 +61,10 @@ public:
 
     /// Shows the overview over the panes, as its key does.
     void openOverview();
+    void openEvents();
+
+    /// Whether lists open as tables, until the user chooses otherwise.
+    void showListsAsTables(bool asTables) { _toolkit.lists().asTables = asTables; }
 
     /// Replaces the status text until the next key.
     void setMessage(std::string message);
@@ -87,6 +102,7 @@ private:
     void escape(TerminalTable& table);
     void save();
     void copyValue(TerminalTable& table);
+    void copy(const std::string& text);
     void startFilter(TerminalTable& table);
     /// Stops typing a filter if another pane is on top, after a click or because its own is gone.
     void endFilterOfOtherPane();

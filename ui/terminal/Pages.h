@@ -1,6 +1,7 @@
 #pragma once
 
 #include "ui/terminal/ChangesPage.h"
+#include "ui/terminal/EventsPage.h"
 #include "ui/terminal/OverviewPage.h"
 
 #include <utility>
@@ -9,7 +10,7 @@
 
 namespace pallax::terminal {
 
-using Page = std::variant<OverviewPage, ChangesPage>;
+using Page = std::variant<OverviewPage, ChangesPage, EventsPage>;
 
 /// The pages over the panes, the last one on top. They are not on the navigation stack, whose panes
 /// are updated meanwhile.

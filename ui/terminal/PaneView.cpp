@@ -1,6 +1,6 @@
 #include "ui/terminal/PaneView.h"
 
-#include "app/pane/FindIgnoringCase.h"
+#include "ui/terminal/MarkedText.h"
 #include "ui/terminal/TerminalToolkit.h"
 #include "ui/terminal/TextWidth.h"
 
@@ -37,32 +37,32 @@ std::size_t leftOutCrumbs(const TerminalNavigation& navigation, const Marks& mar
     return first;
 }
 
-/// Bytes [begin, end) of a text.
-struct Range {
-    std::size_t begin = 0;
-    std::size_t end = 0;
-};
-
-/// A range of `text` widened to whole characters with the combining characters after them.
-Range wholeCharacters(std::string_view text, Range range) {
-    Range whole = range;
-    for (const Cluster& cluster : clustersOf(text)) {
-        if (cluster.offset <= range.begin) {
-            whole.begin = cluster.offset;
-        }
-        if (cluster.offset < range.end) {
-            whole.end = cluster.offset + cluster.bytes;
-        }
+/// "2 of 18" rows with a filter, "4 cells" in a table without one.
+std::string countText(TerminalTable& table) {
+    const std::string shown = std::to_string(table.shownRows());
+    const ColumnTable* const list = table.list();
+    if (!table.filter().empty()) {
+        return shown + " of " + std::to_string(table.pane().totalRows());
     }
-    return whole;
+    if (list == nullptr) {
+        return "";
+    }
+    const TableContent& content = list->model().content();
+    std::string text = shown + " ";
+    return text.append(content.rows.size() == 1 ? content.one : content.many);
 }
 
 /// The most useful keys.
-std::vector<Hint> hintsFor(const ui::BarItems& items, const PaneModel& pane) {
+std::vector<Hint> hintsFor(const ui::BarItems& items, TerminalTable& table) {
     std::vector<Hint> hints;
-    if (!pane.filter().empty()) {
+    if (table.list() != nullptr) {
+        hints = {{"< > sort", typed(U'>')}, {"r reverse", typed(U'r')}, {"t rows", typed(U't')}};
+    } else if (table.isListWithColumns()) {
+        hints = {{"t table", typed(U't')}};
+    }
+    if (!table.filter().empty()) {
         hints.push_back(kClearFilter);
-    } else if (pane.totalRows() > 0) {
+    } else if (table.pane().totalRows() > 0) {
         hints.push_back({"/ filter", typed(U'/')});
     }
     if (saveButtonOf(items) != nullptr) {
@@ -80,21 +80,25 @@ void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
     table.setViewport(static_cast<std::size_t>(rows), rowContentBounds(_grid.columns()));
     Bars bars(_grid, _marks, _hits, status);
     drawTitle(navigation, table, bars);
-    drawRows(table);
+    if (ColumnTable* const list = table.list()) {
+        list->setArea(_grid.columns(), rows);
+        list->draw(_grid, _marks, _hits, kRowsAbove,
+                   [&source = table.source()](std::size_t row) { source.didSelectRow(row); });
+    } else {
+        drawRows(table);
+    }
     drawUpperRule(table, bars, status);
-    const int ruleRight = drawLowerRule(table, static_cast<std::size_t>(rows), bars);
+    const int ruleRight =
+        bars.drawRule(_grid.rows() - kRowsBelow, _marks.down, table.rowsBelow(), Key::PageDown);
     if (status.prompt || navigation.isToolbarShown()) {
         const ui::BarItems& items = navigation.top().toolbarItems();
-        bars.drawLastRow(items, ruleRight, hintsFor(items, table.pane()));
+        bars.drawLastRow(items, ruleRight, hintsFor(items, table));
     }
 }
 
 void PaneView::drawTitle(TerminalNavigation& navigation, TerminalTable& table, Bars& bars) {
     int right = _grid.columns() - kMargin;
-    const PaneModel& pane = table.pane();
-    if (!pane.filter().empty()) {
-        const std::string count =
-            std::to_string(pane.shownRows()) + " of " + std::to_string(pane.totalRows());
+    if (const std::string count = countText(table); !count.empty()) {
         right -= columnsOf(count);
         _grid.put(right, kTitleRow, count, kDim);
         right -= 1;
@@ -128,23 +132,15 @@ void PaneView::drawBreadcrumbs(TerminalNavigation& navigation, int right) {
 }
 
 /// Also says that the values are old, if they are.
-void PaneView::drawUpperRule(const TerminalTable& table, Bars& bars, const PaneStatus& status) {
+void PaneView::drawUpperRule(TerminalTable& table, Bars& bars, const PaneStatus& status) {
     constexpr int kRow = kRowsAbove - 1;
-    const int right = bars.drawRule(kRow, _marks.up, table.firstShown(), Key::PageUp);
+    const int right = bars.drawRule(kRow, _marks.up, table.rowsAbove(), Key::PageUp);
     if (status.oldValues.empty()) {
         return;
     }
     const std::string text = oldValuesText(status.oldValues, right - kMargin);
     const int end = _grid.put(kMargin, kRow, text + " ", kBold, {kMargin, right});
     _hits.add(kMargin, kRow, end - kMargin, 1, [press = status.press] { press(typed(U'R')); });
-}
-
-/// Returns the first column of the number of hidden rows.
-int PaneView::drawLowerRule(const TerminalTable& table, std::size_t windowRows, Bars& bars) {
-    const std::size_t end = table.firstShown() + windowRows;
-    const std::size_t shown = table.pane().shownRows();
-    const std::size_t below = shown - std::min(end, shown);
-    return bars.drawRule(_grid.rows() - kRowsBelow, _marks.down, below, Key::PageDown);
 }
 
 void PaneView::drawRows(TerminalTable& table) {
@@ -190,7 +186,7 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const P
                                   (row.hasChanged && label != contents.labels.front()),
                           .accent = isSelected};
         const int x = columnOf(label->frame.origin.x) - offset;
-        drawLabel(*label, x, y, style, {kMargin, width}, table.pane().filter());
+        (void)putMarked(_grid, {x, y}, label->text, style, {kMargin, width}, table.pane().filter());
         end = std::max(end, x + columnsOf(label->text));
     }
     if (end > width && width > 0) {
@@ -203,23 +199,6 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const P
     } else if (row.hasChanged) {
         _grid.put(last, y, _marks.changed, kBold);
     }
-}
-
-void PaneView::drawLabel(const ui::Label& label, int x, int y, Style style, Span clip,
-                         std::string_view filter) {
-    const std::string_view text = label.text;
-    const std::size_t match =
-        filter.empty() ? std::string_view::npos : findIgnoringCase(text, filter);
-    if (match == std::string_view::npos) {
-        _grid.put(x, y, text, style, clip);
-        return;
-    }
-    const Range found = wholeCharacters(text, {match, match + filter.size()});
-    Style underlined = style;
-    underlined.underline = true;
-    x = _grid.put(x, y, text.substr(0, found.begin), style, clip);
-    x = _grid.put(x, y, text.substr(found.begin, found.end - found.begin), underlined, clip);
-    _grid.put(x, y, text.substr(found.end), style, clip);
 }
 
 } // namespace pallax::terminal

@@ -21,14 +21,11 @@ public:
 private:
     void drawTitle(TerminalNavigation& navigation, TerminalTable& table, Bars& bars);
     void drawBreadcrumbs(TerminalNavigation& navigation, int right);
-    void drawUpperRule(const TerminalTable& table, Bars& bars, const PaneStatus& status);
-    int drawLowerRule(const TerminalTable& table, std::size_t windowRows, Bars& bars);
+    void drawUpperRule(TerminalTable& table, Bars& bars, const PaneStatus& status);
     void drawRows(TerminalTable& table);
     void drawRow(TerminalTable& table, std::size_t shown, int y);
     void drawCell(const TerminalTable& table, ui::TableCell& cell, const PaneRow& row, int y,
                   bool isSelected);
-    void drawLabel(const ui::Label& label, int x, int y, Style style, Span clip,
-                   std::string_view filter);
 
     Grid& _grid;
     const Marks& _marks;

@@ -12,8 +12,9 @@ TerminalTable& terminalTable(ui::TableView& table) {
 }
 
 TerminalTable::TerminalTable(ui::TableSource& source, ui::Rect contentBounds,
-                             NeedsDisplay needsDisplay)
-    : _source(source), _contentBounds(contentBounds), _needsDisplay(std::move(needsDisplay)) {}
+                             NeedsDisplay needsDisplay, ListLook* look)
+    : _source(source), _contentBounds(contentBounds), _needsDisplay(std::move(needsDisplay)),
+      _look(look) {}
 
 std::shared_ptr<ui::TableCell> TerminalTable::dequeueReusableCell(std::string_view /*identifier*/) {
     return nullptr;
@@ -37,7 +38,98 @@ void TerminalTable::reloadData() {
         _sidewaysOffset = 0;
     }
     keepCursorInWindow();
+    if (_look != nullptr && _look->asTables) {
+        refreshList(); // at each tick, so that it knows what has changed
+    } else {
+        _listed = nullptr;
+    }
     _needsDisplay();
+}
+
+void TerminalTable::refreshList() {
+    const NodeRef& node = pane().node();
+    if (node == _listed) {
+        return;
+    }
+    const bool isFollowed = _listed != nullptr;
+    TableModel& model = _list.model();
+    model.update(isListWithColumns() ? tableOf(*node, pane().path(), _look->partAt)
+                                     : TableContent(),
+                 isFollowed ? TableModel::Changes::Mark : TableModel::Changes::Ignore);
+    if (const auto row = pane().cursorRow(); row && !isFollowed) {
+        model.select(*row);
+    }
+    _listed = node;
+}
+
+bool TerminalTable::isListWithColumns() const {
+    return _look != nullptr && pane().node() != nullptr && isTable(*pane().node());
+}
+
+ColumnTable* TerminalTable::list() {
+    if (_look == nullptr || !_look->asTables || !isListWithColumns()) {
+        return nullptr;
+    }
+    refreshList();
+    return &_list;
+}
+
+/// The cursor stays on its entry.
+void TerminalTable::switchLook() {
+    if (ColumnTable* const shown = list()) {
+        const auto row = shown->model().cursorRow();
+        shown->model().setFilter("");
+        pane().setFilter("");
+        _look->asTables = false;
+        moveCursorTo(row.value_or(0));
+    } else {
+        _look->asTables = true;
+    }
+    reloadData();
+}
+
+void TerminalTable::handleListKey(char32_t character) {
+    if (character == U't' && isListWithColumns()) {
+        return switchLook();
+    }
+    ColumnTable* const shown = list();
+    if (shown != nullptr && shown->handleColumnKey(character)) {
+        _needsDisplay();
+    }
+}
+
+std::size_t TerminalTable::rowsAbove() {
+    const ColumnTable* const shown = list();
+    return shown != nullptr ? shown->rowsAbove() : _firstShown;
+}
+
+std::size_t TerminalTable::rowsBelow() {
+    if (const ColumnTable* const shown = list()) {
+        return shown->rowsBelow();
+    }
+    const std::size_t count = pane().shownRows();
+    return count - std::min(_firstShown + _windowRows, count);
+}
+
+std::size_t TerminalTable::shownRows() {
+    const ColumnTable* const shown = list();
+    return shown != nullptr ? shown->model().shownRows() : pane().shownRows();
+}
+
+std::optional<std::size_t> TerminalTable::selectedRow() {
+    const ColumnTable* const shown = list();
+    return shown != nullptr ? shown->model().cursorRow() : pane().cursorRow();
+}
+
+std::optional<std::string> TerminalTable::copied() {
+    const ColumnTable* const shown = list();
+    const auto text = shown != nullptr ? shown->model().copied() : std::nullopt;
+    return text ? text : pane().copied();
+}
+
+const std::string& TerminalTable::filter() {
+    const ColumnTable* const shown = list();
+    return shown != nullptr ? shown->model().filter() : pane().filter();
 }
 
 void TerminalTable::deselectRow(std::size_t /*row*/, bool /*animated*/) {
@@ -58,14 +150,20 @@ void TerminalTable::setViewport(std::size_t rows, ui::Rect contentBounds) {
 }
 
 void TerminalTable::moveCursor(std::ptrdiff_t rows) {
-    const auto target = static_cast<std::ptrdiff_t>(pane().cursor()) + rows;
+    const ColumnTable* const shown = list();
+    const std::size_t cursor = shown != nullptr ? shown->model().cursor() : pane().cursor();
+    const auto target = static_cast<std::ptrdiff_t>(cursor) + rows;
     moveCursorTo(static_cast<std::size_t>(std::max<std::ptrdiff_t>(target, 0)));
 }
 
 void TerminalTable::moveCursorTo(std::size_t shown) {
-    pane().moveCursorTo(shown);
-    _sidewaysOffset = 0;
-    keepCursorInWindow();
+    if (ColumnTable* const table = list()) {
+        table->moveCursorTo(shown);
+    } else {
+        pane().moveCursorTo(shown);
+        _sidewaysOffset = 0;
+        keepCursorInWindow();
+    }
     _needsDisplay();
 }
 
@@ -76,16 +174,30 @@ void TerminalTable::scroll(std::ptrdiff_t rows) {
     moveCursorTo(std::clamp(pane().cursor(), _firstShown, _firstShown + _windowRows - 1));
 }
 
-std::ptrdiff_t TerminalTable::page() const {
+std::ptrdiff_t TerminalTable::page() {
+    if (const ColumnTable* const shown = list()) {
+        return shown->page();
+    }
     return static_cast<std::ptrdiff_t>(std::max<std::size_t>(_windowRows, 2) - 1);
 }
 
 void TerminalTable::setFilter(std::string text) {
-    pane().setFilter(std::move(text));
+    if (ColumnTable* const shown = list()) {
+        shown->model().setFilter(std::move(text));
+    } else {
+        pane().setFilter(std::move(text));
+    }
     reloadData();
 }
 
 bool TerminalTable::scrollSideways(int columns) {
+    if (ColumnTable* const shown = list()) {
+        const bool hasScrolled = shown->scrollSideways(columns);
+        if (hasScrolled) {
+            _needsDisplay();
+        }
+        return hasScrolled;
+    }
     const auto row = pane().cursorRow();
     if (!row) {
         return false;

@@ -77,13 +77,15 @@ std::unique_ptr<ui::ScreenView> TerminalToolkit::makeScreenView() {
 }
 
 std::unique_ptr<ui::TableView> TerminalToolkit::makeTableView(ui::TableSource& source) {
-    return std::make_unique<TerminalTable>(source, rowContentBounds(_columns), _needsDisplay);
+    return std::make_unique<TerminalTable>(source, rowContentBounds(_columns), _needsDisplay,
+                                           &_lists);
 }
 
 /// There is one layout for every name: a list, the field, and the two buttons.
 ui::ModalOutlets TerminalToolkit::loadLayout(std::string_view /*name*/, ui::TableSource& source) {
     ui::ModalOutlets outlets;
-    outlets.list = makeTableView(source);
+    outlets.list =
+        std::make_unique<TerminalTable>(source, rowContentBounds(_columns), _needsDisplay);
     outlets.field = std::make_unique<TerminalTextField>(_needsDisplay);
     return outlets;
 }

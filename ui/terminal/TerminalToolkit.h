@@ -40,6 +40,8 @@ public:
     /// The alert that is open, or null.
     const ui::Alert* alert() const { return _alerts.empty() ? nullptr : &_alerts.front(); }
     void closeAlert();
+    /// For the tables of all panes.
+    ListLook& lists() { return _lists; }
     void setNeedsDisplay() { _needsDisplay(); }
 
 private:
@@ -47,6 +49,7 @@ private:
 
     std::function<void()> _needsDisplay;
     TerminalMetrics _metrics;
+    ListLook _lists;
     int _columns = 80; // until the terminal's extent is known
     int _rows = 24;
     TerminalNavigation* _visible = nullptr;

@@ -107,7 +107,10 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ Left h Backspace  back                          │
 │ Esc               clear the filter, or back     │
 │ /                 filter rows by name or value  │
+│ t                 a list as a table or as rows  │
+│ < > r  x X        sort a table; hide columns    │
 │ o                 overview of the radio         │
+│ e                 events, and go to one         │
 │ Space             hold time; play on from there │
 │ , .               one tick back or forward      │
 │ [ ]               to the event before or after  │

@@ -23,11 +23,14 @@ namespace pallax::terminal {
 class TerminalStage final : public PaneApplication, public ui::NavigationDelegate {
 public:
     explicit TerminalStage(const Marks& marks = kUtf8Marks, Travel* travel = nullptr)
-        : frontEnd({[this] { ++displays; }, [this] { ++quits; },
-                    [this](const std::string& text) { copied.push_back(text); },
-                    [this] { ++repaints; }, [this] { ++startsAfresh; }, [this] { return zone; },
-                    [this] { return overview; }, travel},
-                   marks),
+        : frontEnd(
+              {[this] { ++displays; }, [this] { ++quits; },
+               [this](const std::string& text) { copied.push_back(text); }, [this] { ++repaints; },
+               [this] { ++startsAfresh; }, [this] { return zone; }, [this] { return overview; },
+               [this](const std::string& path) { return entryPart(path); },
+               [this] { return moment; }, [this](std::uint64_t packet) { went.push_back(packet); },
+               [this] { return ahead; }, travel},
+              marks),
           _window(frontEnd.toolkit().makeWindow({})) {
         auto root = std::make_shared<PallaxPaneController>(frontEnd.toolkit(), *this, nullptr, "/");
         root->setStatus("Connecting", true);
@@ -45,6 +48,10 @@ public:
     std::string zone; ///< of the status text's time
     std::vector<std::string> copied;
     Overview overview; ///< what the overview shows
+    EntryPartAt entryPart = ListLook().partAt;
+    Moment moment;
+    std::vector<std::uint64_t> went;
+    std::chrono::seconds ahead{0};
 
     bool savingAllowed = true;
     std::optional<std::string> status; ///< null: follows the connection

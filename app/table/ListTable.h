@@ -1,0 +1,29 @@
+#pragma once
+
+#include "app/table/TableContent.h"
+#include "app/tree/PallaxModelNode.h"
+
+#include <functional>
+#include <string>
+
+namespace pallax {
+
+/// What a field says about which entry of a list an entry is.
+enum class EntryPart {
+    None,
+    Identity, ///< tells which entry it is
+    Cell,     ///< tells which cell it is
+};
+
+/// Returns the part of a field, by its path in the display: "/Neighbor Cells List/*/E-ARFCN".
+using EntryPartAt = std::function<EntryPart(const std::string& path)>;
+
+/// Whether a node is a list with fields in each entry, which can be shown as a table.
+bool isTable(const PallaxModelNode& node);
+
+/// The table of a list at a path: its fields in the order of the display, those of the identity
+/// first. An entry that is a branch is shown as its number of elements.
+TableContent tableOf(const PallaxModelNode& list, const std::string& path,
+                     const EntryPartAt& partAt);
+
+} // namespace pallax

@@ -1,0 +1,478 @@
+#include "tests/ui/terminal/SampleDisplay.h"
+#include "tests/ui/terminal/StageFixture.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+namespace pallax::terminal {
+namespace {
+
+Dictionary cell(const char* code, const char* level) {
+    return Dictionary{{"RSRP", level}, {"PCI", code}, {"Paths", Array{"1", "2"}}};
+}
+
+/// A section, and a list of cells with these entries.
+PropertyList displayOf(const Array& cells) {
+    return Dictionary{{"Cells", cells}, {"SIM Info", Dictionary{{"IMSI", "001010123456789"}}}};
+}
+
+Array threeCells(const char* level = "-91.50 dBm") {
+    return {cell("252", level), cell("184", "-104.00 dBm"), cell("9", "-88.00 dBm")};
+}
+
+class FrontEndTableTest : public StageFixture {
+protected:
+    FrontEndTableTest() {
+        stage.entryPart = [](const std::string& path) {
+            return path == "/Cells/*/PCI" ? EntryPart::Cell : EntryPart::None;
+        };
+        stage.tick(displayOf(threeCells()));
+    }
+    void openTable() {
+        stage.press(Key::Enter);
+        stage.type("t");
+    }
+    bool isTable() { return stage.screen(60, 9).find("PCI  RSRP dBm") != std::string::npos; }
+    /// The row with the cursor, without its mark.
+    std::string cursorRow() {
+        for (const std::string& line : stage.frontEnd.draw().lines()) {
+            if (line.starts_with("▌")) {
+                return line.substr(std::string("▌").size());
+            }
+        }
+        return "(none)";
+    }
+};
+
+TEST_F(FrontEndTableTest, TSwitchesBetweenRowsAndATable) {
+    stage.press(Key::Enter);
+    EXPECT_EQ(stage.screen(60, 9), R"(
+ Pallax › Cells
+ ──────────────────────────────────────────────────────────
+▌0                                                         ›
+ 1                                                         ›
+ 2                                                         ›
+
+
+ ──────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20    / filter  s Save  ? help
+)");
+    stage.type("t");
+    EXPECT_EQ(stage.screen(90, 9), R"(
+ Pallax › Cells                                                                   3 cells
+ ────────────────────────────────────────────────────────────────────────────────────────
+ PCI  RSRP dBm  Paths
+▌252    -91.50      2›
+ 184   -104.00      2›
+   9    -88.00      2›
+
+ ────────────────────────────────────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20     < > sort  r reverse  t rows  / filter  s Save  ? help
+)");
+    stage.type("t");
+    EXPECT_FALSE(isTable());
+}
+
+TEST_F(FrontEndTableTest, AnAsciiTerminalGetsAsciiMarks) {
+    TerminalStage ascii(kAsciiMarks);
+    ascii.frontEnd.showListsAsTables(true);
+    ascii.tick(displayOf(threeCells()));
+    ascii.press(Key::Enter);
+    (void)ascii.screen();
+    ascii.tick(displayOf(threeCells("-89.00 dBm")));
+    ascii.type(">");
+    EXPECT_EQ(ascii.screen(40, 10), R"(
+ Pallax > Cells               3 entries
+ --------------------------------------
+    RSRP
+     dBm^ PCI  Paths
+ -104.00  184      2>
+> -89.00* 252      2>
+  -88.00    9      2>
+
+ --------------------------------------
+ Updated 2023-11-14 at 22:13:20  ? help
+)");
+}
+
+TEST_F(FrontEndTableTest, RowsOfferTheTable) {
+    stage.press(Key::Enter);
+    stage.frontEnd.resize(80, 9);
+    EXPECT_EQ(stage.line(8),
+              " Updated 2023-11-14 at 22:13:20               t table  / filter  s Save  ? help");
+}
+
+TEST_F(FrontEndTableTest, TheSettingOpensListsAsTablesAndTheUsersChoiceHoldsForOthers) {
+    stage.frontEnd.showListsAsTables(true);
+    stage.press(Key::Enter);
+    EXPECT_TRUE(isTable());
+    stage.type("t");
+    stage.press(Key::Left);
+    stage.press(Key::Enter);
+    EXPECT_FALSE(isTable());
+}
+
+TEST_F(FrontEndTableTest, OnlyAListHasATable) {
+    const std::string before = stage.screen(60, 12);
+    const int displays = stage.displays;
+    stage.type("t<>rxX");
+    EXPECT_EQ(stage.displays, displays);
+    EXPECT_EQ(stage.screen(), before);
+    stage.press(Key::Enter);
+    const int rows = stage.displays;
+    stage.type("<>rxX"); // rows have no columns
+    EXPECT_EQ(stage.displays, rows);
+}
+
+TEST_F(FrontEndTableTest, EnterRightLAndAClickOpenTheEntry) {
+    openTable();
+    stage.type(">"); // by PCI: 9, 184, 252
+    stage.press(Key::Home);
+    for (const auto& open : {KeyEvent{.key = Key::Enter}, KeyEvent{.key = Key::Right}, typed(U'l'),
+                             KeyEvent{.key = Key::Click, .x = 5, .y = 4}}) {
+        (void)stage.screen(60, 12);
+        stage.frontEnd.handle(open);
+        EXPECT_EQ(stage.line(0), " Pallax › Cells › 2");
+        stage.press(Key::Left);
+        EXPECT_EQ(cursorRow(), "  9   -88.00      2›");
+    }
+    stage.type("h");
+    EXPECT_EQ(stage.depth(), 1U);
+}
+
+TEST_F(FrontEndTableTest, RightScrollsBeforeItOpens) {
+    openTable();
+    (void)stage.screen(20, 9);
+    stage.press(Key::Right);
+    EXPECT_EQ(stage.depth(), 2U);
+    EXPECT_EQ(stage.line(2), " PCI  Paths");
+    stage.type("l");
+    EXPECT_EQ(stage.depth(), 3U);
+    stage.press(Key::Left);
+    stage.press(Key::Left);
+    EXPECT_EQ(stage.depth(), 2U);
+    EXPECT_EQ(stage.line(2), " PCI  RSRP dBm     …");
+    stage.press(Key::Left);
+    EXPECT_EQ(stage.depth(), 1U);
+}
+
+TEST_F(FrontEndTableTest, TheCursorFollowsTheCellAndChangesAreMarked) {
+    openTable();
+    (void)stage.screen(60, 12);
+    stage.press(Key::Down);
+    EXPECT_EQ(cursorRow(), "184  -104.00      2›");
+    stage.tick(displayOf(
+        {cell("184", "-103.00 dBm"), cell("252", "-91.50 dBm"), cell("7", "-99.00 dBm")}));
+    EXPECT_EQ(stage.screen(60, 9), R"(
+ Pallax › Cells                                     3 cells
+ ──────────────────────────────────────────────────────────
+ PCI  RSRP dBm  Paths
+▌184   -103.00*     2›
+ 252    -91.50      2›
+   7*   -99.00*     2*
+
+ ──────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20    / filter  s Save  ? help
+)");
+    stage.tick(displayOf({}));
+    EXPECT_EQ(cursorRow(), "(none)");
+    stage.tick(displayOf({cell("252", "-91.50 dBm"), cell("184", "-103.00 dBm")}));
+    EXPECT_EQ(cursorRow(), "184*  -103.00*     2*");
+}
+
+TEST_F(FrontEndTableTest, NothingIsMarkedThatChangedWhileRowsWereShown) {
+    openTable();
+    stage.type("t");
+    stage.tick(displayOf(threeCells("-70.00 dBm")));
+    stage.type("t");
+    EXPECT_EQ(stage.screen(60, 12).find("*"), std::string::npos);
+    stage.tick(displayOf(threeCells("-71.00 dBm")));
+    EXPECT_NE(stage.screen(60, 12).find("-71.00*"), std::string::npos);
+}
+
+TEST_F(FrontEndTableTest, TheCursorStaysOnItsEntryWhenTheLookChanges) {
+    stage.press(Key::Enter);
+    stage.press(Key::Down);
+    stage.type("t");
+    (void)stage.screen(60, 12);
+    EXPECT_EQ(cursorRow(), "184  -104.00      2›");
+    stage.type(">");
+    stage.press(Key::Home); // PCI 9
+    stage.type("t");
+    EXPECT_EQ(stage.cursorName(), "2");
+}
+
+TEST_F(FrontEndTableTest, KeysAndTheWheelMoveTheCursor) {
+    openTable();
+    (void)stage.screen(60, 12);
+    stage.type("G");
+    EXPECT_EQ(cursorRow(), "  9   -88.00      2›");
+    stage.type("kk");
+    EXPECT_EQ(cursorRow(), "252   -91.50      2›");
+    stage.mouse(Key::WheelDown, 0, 0);
+    EXPECT_EQ(cursorRow(), "  9   -88.00      2›");
+    stage.press(Key::PageUp);
+    EXPECT_EQ(cursorRow(), "252   -91.50      2›");
+}
+
+TEST_F(FrontEndTableTest, AClickOnAHeadingSorts) {
+    openTable();
+    (void)stage.screen(60, 12);
+    stage.click(8, 2);
+    EXPECT_EQ(stage.line(3), " PCI      dBm↑ Paths");
+    EXPECT_EQ(stage.line(4), " 184  -104.00      2›");
+}
+
+TEST_F(FrontEndTableTest, TheFilterLooksIntoEveryCell) {
+    openTable();
+    stage.type("/-104");
+    EXPECT_EQ(stage.screen(60, 9), R"(
+ Pallax › Cells                                      1 of 3
+ ──────────────────────────────────────────────────────────
+ PCI  RSRP dBm  Paths
+▌184   -104.00      2›
+
+
+
+ ──────────────────────────────────────────────────────────
+ / -104                                    Esc clear filter
+)");
+    stage.press(Key::Enter);
+    stage.press(Key::Escape);
+    EXPECT_EQ(stage.depth(), 2U);
+    EXPECT_EQ(stage.line(0), " Pallax › Cells                                     3 cells");
+    stage.type("/-104");
+    stage.press(Key::Enter);
+    stage.type("t");
+    EXPECT_EQ(stage.pane().shownRows(), 3U) << "rows have no such filter";
+}
+
+TEST_F(FrontEndTableTest, YCopiesTheIdentityOrTheChosenValue) {
+    openTable();
+    stage.type("y>>y>y");
+    EXPECT_EQ(stage.copied, (std::vector<std::string>{"252", "-91.50 dBm", "2"}));
+    stage.entryPart = ListLook().partAt;
+    stage.type("<<<y");
+    EXPECT_EQ(stage.copied.back(), "252");
+}
+
+TEST_F(FrontEndTableTest, TheCountSaysWhatTheRowsAre) {
+    stage.tick(displayOf({cell("252", "-91.50 dBm")}));
+    openTable();
+    (void)stage.screen(60, 9);
+    EXPECT_EQ(stage.line(0), " Pallax › Cells                                      1 cell");
+    stage.entryPart = ListLook().partAt;
+    stage.tick(displayOf(threeCells()));
+    EXPECT_EQ(stage.line(0), " Pallax › Cells                                   3 entries");
+    stage.type("y");
+    EXPECT_EQ(stage.copied.back(), "0") << "without an identity, the entry's name";
+}
+
+TEST_F(FrontEndTableTest, RowsOutsideTheWindowAreCountedInTheRules) {
+    openTable();
+    stage.press(Key::Down);
+    EXPECT_EQ(stage.screen(30, 6), R"(
+ Pallax › Cells       3 cells
+ ────────────────────── ↑ 1 ─
+ PCI  RSRP dBm  Paths
+▌184   -104.00      2›
+ ────────────────────── ↓ 1 ─
+ …ated 2023-11-14 at 22:13:20
+)");
+}
+
+/// A list of a sample's display as a table.
+class SampleTable : public testing::Test {
+protected:
+    void open(const std::string& sample, const char* list) {
+        shown.emplace(sample);
+        stage.entryPart = [this](const std::string& path) {
+            return shown->watch.namesCell(path)    ? EntryPart::Cell
+                   : shown->watch.identifies(path) ? EntryPart::Identity
+                                                   : EntryPart::None;
+        };
+        stage.frontEnd.showListsAsTables(true);
+        stage.tick(shown->driver.display());
+        openList(list);
+    }
+
+    void openList(const char* list) {
+        stage.type("/");
+        stage.type(list);
+        stage.press(Key::Home);
+        stage.press(Key::Enter);
+        stage.press(Key::Home);
+        stage.press(Key::Enter);
+    }
+
+    std::optional<SampleDisplay> shown;
+    TerminalStage stage;
+};
+
+TEST_F(SampleTable, OfLte) {
+    open("lte-drive", "Neighbor Cells List");
+    EXPECT_EQ(stage.screen(80, 24), R"(
+ Pallax › Neighbor Cells List                                           2 cells
+ ──────────────────────────────────────────────────────────────────────────────
+ Physical  Measured  Measured   Average  Measured  Average  Srxlev  Frequency
+  Cell ID  RSSI dBm  RSRP dBm  RSRP dBm   RSRQ dB  RSRQ dB     dBm     Offset  …
+▌     184    -64.00    -94.00    -94.00     -9.75    -9.75      28         22
+      285    -64.00    -97.00    -96.00    -12.00   -12.00      26         32
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+ ──────────────────────────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20     r reverse  t rows  / filter  s Save  ? help
+)");
+    EXPECT_EQ(stage.screen(40, 20), R"(
+ Pallax › Neighbor Cells List   2 cells
+ ──────────────────────────────────────
+ Physical  Measured  Measured   Average
+  Cell ID  RSSI dBm  RSRP dBm  RSRP dBm…
+▌     184    -64.00    -94.00    -94.00
+      285    -64.00    -97.00    -96.00
+
+
+
+
+
+
+
+
+
+
+
+
+ ──────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20  ? help
+)");
+    EXPECT_EQ(stage.screen(200, 60), R"(
+ Pallax › Neighbor Cells List                                                                                                                                                                   2 cells
+ ──────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────
+ Physical  Measured  Measured   Average  Measured  Average  Srxlev  Frequency  Ant 0 Frame  Ant 0 Sample  Ant 1 Frame  Ant 1 Sample
+  Cell ID  RSSI dBm  RSRP dBm  RSRP dBm   RSRQ dB  RSRQ dB     dBm     Offset       Offset        Offset       Offset        Offset
+▌     184    -64.00    -94.00    -94.00     -9.75    -9.75      28         22          103        149688          103        149688
+      285    -64.00    -97.00    -96.00    -12.00   -12.00      26         32          359         11549          359         11549
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+ ──────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20                                                                                                                   < > sort  r reverse  t rows  / filter  s Save  ? help
+)");
+}
+
+TEST_F(SampleTable, OfUmts) {
+    open("umts-drive", "UMTS Set");
+    EXPECT_EQ(stage.screen(80, 8), R"(
+ Pallax › UMTS Set                                                      2 cells
+ ──────────────────────────────────────────────────────────────────────────────
+ UARFCN  Scrambling Code  RSCP dBm  Energy Per Chip dB
+▌ 10713              212      -103                 -20
+  10713               97      -109                 -20
+
+ ──────────────────────────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20     r reverse  t rows  / filter  s Save  ? help
+)");
+}
+
+TEST_F(SampleTable, OfUtran) {
+    open("utran-drive", "CCTRCH SIR");
+    EXPECT_EQ(stage.screen(80, 8), R"(
+ Pallax › CCTRCH SIR                                                  2 entries
+ ──────────────────────────────────────────────────────────────────────────────
+ CCTRCH ID  TSNUM  SIR
+▌        1      4    6›
+         2      5    6›
+
+ ──────────────────────────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20     r reverse  t rows  / filter  s Save  ? help
+)");
+    stage.press(Key::Left);
+    stage.press(Key::Escape);
+    openList("Neighbor Cell List");
+    EXPECT_EQ(stage.screen(80, 16), R"(
+ Pallax › Neighbor Cell List                                           10 cells
+ ──────────────────────────────────────────────────────────────────────────────
+         Cell    Filter
+ UARFCN    ID      RSCP  Status  inJDCS
+▌ 10096    95  0.371094  ASET    TRUE
+  10096    61  0.394531  MSET    FALSE
+  10088   122  0.343750  MSET    FALSE
+  10104    34  0.335938  MSET    FALSE
+  10104    68  0.312500  MSET    FALSE
+  10088    28  0.246094  MSET    FALSE
+  10088    88  0.207031  DSET    FALSE
+  10104    55  0.199219  DSET    FALSE
+  10096     1  0.207031  DSET    FALSE
+  10104    21  0.175781  DSET    FALSE
+ ──────────────────────────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20     r reverse  t rows  / filter  s Save  ? help
+)");
+}
+
+} // namespace
+} // namespace pallax::terminal
