@@ -24,8 +24,38 @@ void StatusWatch::begin(std::string_view technology) {
 
 Overview StatusWatch::overview(Time time, const NetworkNames& names,
                                const QualityProfile& profile) const {
-    return _known ? Overview{statusOf(_known->values, time, names, profile), _known->events}
-                  : Overview();
+    if (!_known) {
+        return {};
+    }
+    Overview overview{statusOf(_known->values, time, names, profile), _known->events};
+    for (StatusCell& cell : overview.status.cells) {
+        for (auto* values : {&cell.identity, &cell.levels}) {
+            for (StatusValue& value : *values) {
+                addPatience(value);
+            }
+        }
+        if (cell.channel) {
+            addPatience(*cell.channel);
+        }
+    }
+    return overview;
+}
+
+void StatusWatch::addPatience(StatusValue& value) const {
+    const auto field = _known->fields.named(value.field);
+    if (field && *field < _known->arrivals.size()) {
+        value.patience = _known->arrivals[*field].patience();
+    }
+}
+
+void StatusWatch::valueRead(FieldIndex field, EntryId entry, const FieldValue& value) {
+    _known->finder.valueRead(field, value);
+    if (entry == kNoEntry) {
+        if (field >= _known->arrivals.size()) {
+            _known->arrivals.resize(_known->fields.size());
+        }
+        _known->arrivals[field].note(value.read);
+    }
 }
 
 void StatusWatch::beginPacket(const SamplePacket& packet) {

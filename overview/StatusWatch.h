@@ -1,5 +1,6 @@
 #pragma once
 
+#include "monitor/Arrivals.h"
 #include "overview/Status.h"
 #include "packets/StampSequence.h"
 #include "timeline/Event.h"
@@ -71,7 +72,8 @@ private:
         CurrentValues values;
         EventFinder finder;
         StampSequence stamps;
-        SamplePacket packet; ///< the current one
+        SamplePacket packet;            ///< the current one
+        std::vector<Arrivals> arrivals; ///< by field; of fields that are not in a list
         std::vector<Event> events;
     };
 
@@ -81,9 +83,9 @@ private:
             samples(_known->values);
         }
     }
-    void valueRead(FieldIndex field, EntryId /*entry*/, const FieldValue& value) override {
-        _known->finder.valueRead(field, value);
-    }
+    void valueRead(FieldIndex field, EntryId entry, const FieldValue& value) override;
+    /// Adds how long the value may be missing.
+    void addPatience(StatusValue& value) const;
     void valueRemoved(FieldIndex field) override { _known->finder.valueRemoved(field); }
     void listReplaced(ListId list) override { _known->finder.listReplaced(list); }
 
