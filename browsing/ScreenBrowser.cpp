@@ -106,6 +106,8 @@ bool ScreenBrowser::run() {
         _link, [this] { return _session.isConnected(); },
         [this](const std::string& text) { _frontEnd.setNote(text); });
     _frontEnd.resize(_terminal.columns(), _terminal.rows());
+    _ageing =
+        _link.clock().scheduleRepeating(PallaxModel::kDisplayInterval, [this] { needsDisplay(); });
     waitForKey();
     return _session.run();
 }

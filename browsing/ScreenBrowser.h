@@ -52,6 +52,7 @@ private:
     HostFileSystem _files;
     FilePreferences _preferences;
     BrowsingSession _session;
+    std::unique_ptr<RepeatingTimer> _ageing;  // ages grow also while no packet comes
     std::unique_ptr<RepeatingTimer> _turning; // while something on the screen turns
 };
 
