@@ -4,6 +4,7 @@
 #include "host/KnowledgeFiles.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
+#include "link/StreamState.h"
 #include "platform/ZoneText.h"
 
 #include <chrono>
@@ -105,6 +106,11 @@ bool ScreenBrowser::run() {
     const LinkNotes notes(
         _link, [this] { return _session.isConnected(); },
         [this](const std::string& text) { _frontEnd.setNote(text); });
+    const StreamState stream({_link.queue(), [this] { return _session.isConnected(); },
+                              [this] { return _link.clock().isLive(); },
+                              [this] { return _link.received(); },
+                              [this] { return _link.briefObstacle(); },
+                              [this](const std::string& text) { _frontEnd.setStream(text); }});
     _frontEnd.resize(_terminal.columns(), _terminal.rows());
     _ageing =
         _link.clock().scheduleRepeating(PallaxModel::kDisplayInterval, [this] { needsDisplay(); });

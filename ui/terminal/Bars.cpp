@@ -38,6 +38,12 @@ bool isLoading(const ui::BarItems& items) {
 }
 
 int Bars::drawOrigin(int right, int columns) {
+    if (!_status.stream.empty()) {
+        const int used = std::min(columnsOf(_status.stream), right - kMargin);
+        _grid.put(right - used, kTitleRow, _status.stream, {.bold = true}, {kMargin, right});
+        right -= used + kGap;
+        columns -= used + kGap;
+    }
     const std::string text = originText(_status.origin, _marks, columns);
     if (text.empty()) {
         return right;

@@ -61,6 +61,7 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .note = _note,
                             .origin = _origin,
                             .oldValues = _oldValues,
+                            .stream = _stream,
                             .zone = _surroundings.zone(),
                             .press = [this](const KeyEvent& event) { handle(event); }};
     if (_pages.isOpen()) {
@@ -88,6 +89,11 @@ void FrontEnd::setNote(std::string note) {
 
 void FrontEnd::setOrigin(Origin origin) {
     _origin = std::move(origin);
+    needsDisplay();
+}
+
+void FrontEnd::setStream(std::string state) {
+    _stream = std::move(state);
     needsDisplay();
 }
 

@@ -55,6 +55,8 @@ public:
 
     /// Sets the origin of the values.
     void setOrigin(Origin origin);
+    /// Why nothing changes ("no data for 7 s"); "" if the display is as current as it can be.
+    void setStream(std::string state);
     /// After a restart of the link: the values are from before `time` ("22:13:30"); if empty, they
     /// are current.
     void setOldValues(std::string time);
@@ -97,6 +99,7 @@ private:
     std::optional<std::string> _message;
     std::string _note;
     Origin _origin;
+    std::string _stream;
     std::string _oldValues;
     std::size_t _spinnerTurn = 0;
 };
