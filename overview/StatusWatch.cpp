@@ -3,6 +3,7 @@
 #include "platform/RecordedTechnology.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace pallax {
 
@@ -74,8 +75,20 @@ void StatusWatch::endPacket() {
     if (!_known) {
         return;
     }
+    _known->finder.endPacket(_known->packet.number, _known->packet.time, _known->values,
+                             _known->events);
+    forgetEarlyEvents();
+}
+
+void StatusWatch::add(Event event) {
+    if (_known) {
+        _known->events.push_back(std::move(event));
+        forgetEarlyEvents();
+    }
+}
+
+void StatusWatch::forgetEarlyEvents() {
     std::vector<Event>& events = _known->events;
-    _known->finder.endPacket(_known->packet.number, _known->packet.time, _known->values, events);
     if (events.size() > kMostEvents) {
         events.erase(events.begin(), events.end() - kMostEvents);
     }

@@ -36,6 +36,11 @@ public:
     /// ("Zorell_LTE"); of an unknown technology, they are dropped. Not during a packet.
     void begin(std::string_view technology);
 
+    /// The current values; null without a technology. Valid until the next `begin`.
+    const CurrentValues* values() const { return _known ? &_known->values : nullptr; }
+    /// Adds an event that the samples do not tell. Nothing happens without a technology.
+    void add(Event event);
+
     Overview overview(Time time, const NetworkNames& names, const QualityProfile& profile) const;
 
     void beginPacket(const SamplePacket& packet) override;
@@ -84,6 +89,7 @@ private:
         }
     }
     void valueRead(FieldIndex field, EntryId entry, const FieldValue& value) override;
+    void forgetEarlyEvents();
     /// Adds how long the value may be missing.
     void addPatience(StatusValue& value) const;
     void valueRemoved(FieldIndex field) override { _known->finder.valueRemoved(field); }

@@ -142,6 +142,24 @@ TEST(StatusWatch, AValueThatCameOnceIsNeverOverdue) {
     EXPECT_TRUE(isOld(later.status.time, *area));
 }
 
+TEST(StatusWatch, AnEventCanBeAddedToItsOwn) {
+    Watched watched("lte");
+    watched.recorded.drive(3, 60s, 20);
+    watched.play();
+    for (std::size_t number = 0; number < StatusWatch::kMostEvents; ++number) {
+        watched.watch.add({EventKind::Alarm, watched.end, 0, std::to_string(number), {}});
+    }
+    const auto events = watched.overview().events;
+    ASSERT_EQ(events.size(), StatusWatch::kMostEvents);
+    EXPECT_EQ(events.front().words, "0");
+    EXPECT_EQ(events.back().words, "31");
+    ASSERT_NE(watched.watch.values(), nullptr);
+    watched.watch.begin("Another");
+    watched.watch.add({EventKind::Alarm, watched.end, 0, "lost", {}});
+    EXPECT_TRUE(watched.overview().events.empty());
+    EXPECT_EQ(watched.watch.values(), nullptr);
+}
+
 TEST(StatusWatch, DoesNotTellATimeAcrossAGap) {
     Watched watched("lte");
     watched.recorded.drive(3, 60s);
