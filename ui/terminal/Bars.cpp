@@ -38,12 +38,15 @@ bool isLoading(const ui::BarItems& items) {
 }
 
 int Bars::drawOrigin(int right, int columns) {
-    if (!_status.stream.empty()) {
-        const int used = std::min(columnsOf(_status.stream), right - kMargin);
-        _grid.put(right - used, kTitleRow, _status.stream, {.bold = true}, {kMargin, right});
-        right -= used + kGap;
-        columns -= used + kGap;
+    const int end = right;
+    for (const std::string& notice : {_status.stream, alarmText(_status.alarms, right / 2)}) {
+        if (!notice.empty()) {
+            const int left = std::max(right - columnsOf(notice), kMargin);
+            _grid.put(left, kTitleRow, notice, {.bold = true}, {kMargin, right});
+            right = left - kGap;
+        }
     }
+    columns -= end - right;
     const std::string text = originText(_status.origin, _marks, columns);
     if (text.empty()) {
         return right;

@@ -34,7 +34,8 @@ struct PaneStatus {
     Origin origin;         ///< in the title
     std::string oldValues; ///< the time of values that are no longer updated
     std::string stream;    ///< why nothing changes; in the title
-    std::string zone;      ///< for the time in the status text
+    std::vector<std::string> alarms; ///< the names of those that are true; in the title
+    std::string zone;                ///< for the time in the status text
     std::function<void(const KeyEvent&)> press = [](const KeyEvent&) {}; ///< by a click
 };
 
@@ -55,9 +56,9 @@ public:
     Bars(Grid& grid, const Marks& marks, HitMap& hits, const PaneStatus& status)
         : _grid(grid), _marks(marks), _hits(hits), _status(status) {}
 
-    /// The state of the stream, and the origin of the values, in at most `columns` columns of the
-    /// title row, before column `right`. The state takes the room that it needs. Returns where the
-    /// room for the title ends.
+    /// Alarms, the state of the stream, and the origin of the values, in at most `columns` columns
+    /// of the title row, before column `right`. Only the origin leaves the title its room. Returns
+    /// where the room for the title ends.
     int drawOrigin(int right, int columns);
     /// A rule that ends with the number of rows outside the window; returns the first column of the
     /// number.

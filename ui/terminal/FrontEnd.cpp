@@ -62,6 +62,7 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .origin = _origin,
                             .oldValues = _oldValues,
                             .stream = _stream,
+                            .alarms = _alarms,
                             .zone = _surroundings.zone(),
                             .press = [this](const KeyEvent& event) { handle(event); }};
     if (_pages.isOpen()) {
@@ -94,6 +95,11 @@ void FrontEnd::setOrigin(Origin origin) {
 
 void FrontEnd::setStream(std::string state) {
     _stream = std::move(state);
+    needsDisplay();
+}
+
+void FrontEnd::setAlarms(std::vector<std::string> names) {
+    _alarms = std::move(names);
     needsDisplay();
 }
 
