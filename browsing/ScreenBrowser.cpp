@@ -1,11 +1,13 @@
 #include "browsing/ScreenBrowser.h"
 
 #include "browsing/LinkNotes.h"
+#include "decoding/InstalledKnowledge.h"
 #include "host/KnowledgeFiles.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
 #include "link/StreamState.h"
 #include "platform/ZoneText.h"
+#include "text/Format.h"
 
 #include <chrono>
 #include <csignal>
@@ -24,6 +26,10 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                              terminal::CursesTerminal& terminal, StandardOutput& notices)
     : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, notices),
       _keys(_link.queue(), terminal.inputDescriptor()), _watch(_link.resources()),
+      _alarms({settings.alarms, installedKnowledge(),
+               [this](const auto& text) {
+                   _frontEnd.toolkit().showAlert({"Alarms that are left out", text, "Close"});
+               }}),
       _frontEnd(frontEndSurroundings(), terminal.marks()),
       _preferences(FilePreferences::userFolder()),
       _session(sessionSurroundings(std::move(source), settings)) {
@@ -66,7 +72,7 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource s
                      .note = [this](const auto& text) { _frontEnd.setNote(text); },
                      .origin =
                          [this](const auto& technology, const auto& name) {
-                             _watch.begin(technology);
+                             begin(technology);
                              _frontEnd.setOrigin({technology, name});
                          },
                      .oldValues = [this](const auto& time) { _frontEnd.setOldValues(time); }},
@@ -76,6 +82,33 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource s
             .snapshotDirectory = settings.snapshotDirectory,
             .saveButtonMarker = settings.saveButtonMarker,
             .startsAfreshByItself = settings.afterReconnect == AfterReconnect::Fresh};
+}
+
+void ScreenBrowser::begin(const std::string& technology) {
+    _alarms.begin(nullptr); // the values end
+    _watch.begin(technology);
+    _alarms.begin(_watch.values());
+    _frontEnd.setAlarms({});
+}
+
+/// Comes also while there are no packets, when ages grow.
+void ScreenBrowser::tick() {
+    const Time now = _link.clock().now();
+    const StateMoment moment{now, _link.clock().packetNumber(), ++_ticks};
+    for (const AlarmWatch::Change& change : _alarms.tick(moment)) {
+        const auto held = std::chrono::round<std::chrono::seconds>(change.held).count();
+        _watch.add({EventKind::Alarm,
+                    now,
+                    moment.packet,
+                    change.isTrue ? "alarm: " + change.rule->name
+                                  : formatText("alarm ended: %@ (held for %lld s)",
+                                               {change.rule->name, held}),
+                    {}});
+        if (change.isTrue && change.rule->ringsBell) {
+            _terminal.ringBell();
+        }
+    }
+    _frontEnd.setAlarms(_alarms.holding());
 }
 
 Overview ScreenBrowser::overview() {
@@ -112,8 +145,7 @@ bool ScreenBrowser::run() {
                               [this] { return _link.briefObstacle(); },
                               [this](const std::string& text) { _frontEnd.setStream(text); }});
     _frontEnd.resize(_terminal.columns(), _terminal.rows());
-    _ageing =
-        _link.clock().scheduleRepeating(PallaxModel::kDisplayInterval, [this] { needsDisplay(); });
+    _ticking = _link.clock().scheduleRepeating(PallaxModel::kDisplayInterval, [this] { tick(); });
     waitForKey();
     return _session.run();
 }

@@ -8,7 +8,9 @@
 #include "overview/StatusWatch.h"
 #include "ui/terminal/CursesTerminal.h"
 #include "ui/terminal/FrontEnd.h"
+#include "watching/AlarmWatch.h"
 
+#include <cstdint>
 #include <memory>
 #include <optional>
 
@@ -36,6 +38,8 @@ private:
     terminal::FrontEnd::Surroundings frontEndSurroundings();
     void waitForKey();
     void readKey();
+    void begin(const std::string& technology);
+    void tick();
     void needsDisplay();
     void display();
     void keepTurning();
@@ -47,12 +51,14 @@ private:
     BrowseLink _link;
     DescriptorWatch _keys;
     StatusWatch _watch;
+    AlarmWatch _alarms;
+    std::uint64_t _ticks = 0;
     std::optional<NetworkNames> _names; ///< read when the overview is drawn for the first time
     terminal::FrontEnd _frontEnd;
     HostFileSystem _files;
     FilePreferences _preferences;
     BrowsingSession _session;
-    std::unique_ptr<RepeatingTimer> _ageing;  // ages grow also while no packet comes
+    std::unique_ptr<RepeatingTimer> _ticking;
     std::unique_ptr<RepeatingTimer> _turning; // while something on the screen turns
 };
 
