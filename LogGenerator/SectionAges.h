@@ -26,6 +26,9 @@ public:
         return found != _read.end() ? std::optional(found->second) : std::nullopt;
     }
 
+    /// All times that were noted, by path.
+    const std::map<std::string, Time, std::less<>>& all() const { return _read; }
+
 private:
     std::map<std::string, Time, std::less<>> _read;
 };

@@ -6,6 +6,8 @@
 #include "platform/MainQueue.h"
 #include "platform/ui/Toolkit.h"
 
+#include <algorithm>
+#include <chrono>
 #include <utility>
 
 namespace pallax {
@@ -83,6 +85,7 @@ void PallaxApp::startAfresh() {
     _model.reset(); // frees the port's name for the next model
     _model = _surroundings.makeModel(*this);
     _displayAge = {};
+    _valueAges.clear();
     _technology.clear();
     setUpdateMessage(kNotConnected);
     _navController->popTo(0, false);
@@ -164,6 +167,9 @@ void PallaxApp::updateViewControllerFromModel() {
     }
     _displayAge.shown(_surroundings.clock.now());
     reloadPanes();
+    if (_model) {
+        _valueAges.take(_model->sectionAges());
+    }
     if (isConnected()) {
         setUpdateMessage(_dateFormatter->stringFromDate(_surroundings.clock.now()));
     }
@@ -205,6 +211,20 @@ void PallaxApp::reloadPanes() {
         }
         pane.reloadWithNode(std::move(node), _surroundings.clock.now());
     }
+}
+
+ReadingAges PallaxApp::readingAges() {
+    return [this](const std::string& path) -> std::optional<ReadingAge> {
+        const Arrivals* arrivals = _valueAges.arrivals(path);
+        if (arrivals == nullptr) {
+            return std::nullopt;
+        }
+        // A stamp may be ahead of the display's clock, which does not step back.
+        const std::chrono::nanoseconds age =
+            std::max<std::chrono::nanoseconds>(_surroundings.clock.now() - *arrivals->last(), {});
+        const auto patience = arrivals->patience();
+        return ReadingAge{age, patience && age > *patience};
+    };
 }
 
 void PallaxApp::updateTopStatus() {

@@ -5,6 +5,7 @@
 #include "app/PallaxSaveViewController.h"
 #include "monitor/DisplayAge.h"
 #include "monitor/PallaxModel.h"
+#include "monitor/ValueAges.h"
 #include "platform/ui/NavigationStack.h"
 #include "platform/ui/Window.h"
 
@@ -106,6 +107,8 @@ public:
     }
     bool allowSaveButton() const override { return _allowSaveButton; }
     void setAllowSaveButton(bool allowed) { _allowSaveButton = allowed; }
+    /// By the display's clock.
+    ReadingAges readingAges() override;
     ui::NavigationStack* navigationController() override { return _navController.get(); }
 
 private:
@@ -129,6 +132,7 @@ private:
     bool _isRestartPosted = false;
     std::string _technology;
     DisplayAge _displayAge;
+    ValueAges _valueAges;
     std::shared_ptr<PallaxApp*> _alive;
 };
 

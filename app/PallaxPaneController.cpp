@@ -40,7 +40,9 @@ std::shared_ptr<PallaxCell> reusableCell(ui::TableView& table) {
 PallaxPaneController::PallaxPaneController(ui::Toolkit& toolkit, PaneApplication& application,
                                            NodeRef node, std::string path)
     : TableScreen(toolkit), _toolkit(toolkit), _application(application),
-      _pane(std::move(node), std::move(path)) {}
+      _pane(std::move(node), std::move(path)) {
+    _pane.setAges(application.readingAges());
+}
 
 void PallaxPaneController::createToolbarItems() {
     ui::ActivityIndicator indicator;

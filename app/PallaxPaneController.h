@@ -22,6 +22,8 @@ public:
     /// Whether panes offer the save button.
     virtual bool allowSaveButton() const = 0;
     virtual void showSaveView() = 0;
+    /// Where the panes get the ages of their values; valid as long as the application.
+    virtual ReadingAges readingAges() { return {}; }
     /// The panes' stack; null until it exists.
     virtual ui::NavigationStack* navigationController() = 0;
 };

@@ -53,9 +53,10 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     bool isWhole = false;
     try {
-        PrintBrowser browser(std::move(directory), request.onFatalRecord, child,
-                             request.settings.afterReconnect, output,
-                             sourceName(request.options.source));
+        PrintBrowser browser(
+            std::move(directory), request.onFatalRecord, child, request.settings.afterReconnect,
+            output, sourceName(request.options.source),
+            request.options.plain ? TreePrinter::Form::Sentences : TreePrinter::Form::Tree);
         isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // the printed text and the generators' notices
@@ -202,9 +203,9 @@ ExitStatus runBrowse(const BrowseOptions& wanted) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
-    const Request request{options, *settings,
-                          options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,
-                          !options.print && terminal::CursesTerminal::isPossible()};
+    const Request request{
+        options, *settings, options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,
+        !options.print && !options.plain && terminal::CursesTerminal::isPossible()};
     SyslogSink syslog("pallax");
     if (!options.logLevel) {
         const ScopedLog log(syslog, settings->systemLogLevel);

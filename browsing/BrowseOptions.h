@@ -12,6 +12,7 @@ struct BrowseOptions {
     Source source;
     PlayOptions play;
     bool print = false;
+    bool plain = false; ///< prints sentences instead of trees
     terminal::ColorUse color = terminal::ColorUse::Auto;
     bool mouse = true;
     bool keepGoing = false;

@@ -21,10 +21,11 @@ void PrintBrowser::Notices::printLine(std::string_view line) {
 
 PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
                            ChildService* child, AfterReconnect afterReconnect, Output& output,
-                           std::string source)
+                           std::string source, TreePrinter::Form form)
     : _source(std::move(source)), _afterReconnect(afterReconnect), _notices(output),
       _link(std::move(directory), onFatalRecord, child, _notices),
-      _printer(output, _link.clock(), [this] { return _model->topLevelNodes(); }),
+      _printer(
+          output, _link.clock(), [this] { return _model->topLevelNodes(); }, form),
       _model(makeModel()) {}
 
 PrintBrowser::~PrintBrowser() {

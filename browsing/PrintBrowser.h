@@ -19,7 +19,8 @@ class PrintBrowser final : private ModelObserver {
 public:
     /// `source` names the source in messages.
     PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                 AfterReconnect afterReconnect, Output& output, std::string source);
+                 AfterReconnect afterReconnect, Output& output, std::string source,
+                 TreePrinter::Form form);
     /// Switches the home-screen preference off, as the application does, however browsing ended.
     ~PrintBrowser() override;
     PrintBrowser(const PrintBrowser&) = delete;

@@ -5,6 +5,7 @@
 #include "host/KnowledgeFiles.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
+#include "link/StreamState.h"
 #include "platform/ZoneText.h"
 #include "text/Format.h"
 
@@ -36,7 +37,12 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                          }
                      },
                  .replaced = [this] { _travel.reset(); }}),
-      _travel(travelSurroundings()), _frontEnd(frontEndSurroundings(), terminal.marks()),
+      _travel(travelSurroundings()),
+      _alarms({settings.alarms, installedKnowledge(),
+               [this](const auto& text) {
+                   _frontEnd.toolkit().showAlert({"Alarms that are left out", text, "Close"});
+               }}),
+      _frontEnd(frontEndSurroundings(), terminal.marks()),
       _preferences(FilePreferences::userFolder()), _session(sessionSurroundings(source, settings)) {
     _frontEnd.showListsAsTables(settings.lists == Lists::Table);
     if (settings.firstScreen == FirstScreen::Overview) {
@@ -121,8 +127,7 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(const Source& s
                      .note = [this](const auto& text) { _frontEnd.setNote(text); },
                      .origin =
                          [this](const auto& technology, const auto& name) {
-                             _watch.begin(technology);
-                             _timeline.begin(technology);
+                             begin(technology);
                              _frontEnd.setOrigin({technology, name});
                          },
                      .oldValues = [this](const auto& time) { _frontEnd.setOldValues(time); }},
@@ -139,6 +144,34 @@ EntryPart ScreenBrowser::entryPart(const std::string& path) const {
         return EntryPart::Cell;
     }
     return _watch.identifies(path) ? EntryPart::Identity : EntryPart::None;
+}
+
+void ScreenBrowser::begin(const std::string& technology) {
+    _alarms.begin(nullptr); // the values end
+    _watch.begin(technology);
+    _timeline.begin(technology);
+    _alarms.begin(_watch.values());
+    _frontEnd.setAlarms({});
+}
+
+/// Comes also while there are no packets, when ages grow.
+void ScreenBrowser::tick() {
+    const Time now = _link.clock().now();
+    const StateMoment moment{now, _link.clock().packetNumber(), ++_ticks};
+    for (const AlarmWatch::Change& change : _alarms.tick(moment)) {
+        const auto held = std::chrono::round<std::chrono::seconds>(change.held).count();
+        _watch.add({EventKind::Alarm,
+                    now,
+                    moment.packet,
+                    change.isTrue ? "alarm: " + change.rule->name
+                                  : formatText("alarm ended: %@ (held for %lld s)",
+                                               {change.rule->name, held}),
+                    {}});
+        if (change.isTrue && change.rule->ringsBell) {
+            _terminal.ringBell();
+        }
+    }
+    _frontEnd.setAlarms(_alarms.holding());
 }
 
 Overview ScreenBrowser::overview() {
@@ -171,7 +204,13 @@ bool ScreenBrowser::run() {
     const LinkNotes notes(
         _link, [this] { return _session.isConnected(); },
         [this](const std::string& text) { _frontEnd.setNote(text); });
+    const StreamState stream({_link.queue(), [this] { return _session.isConnected(); },
+                              [this] { return _link.clock().isLive(); },
+                              [this] { return _link.received(); },
+                              [this] { return _link.briefObstacle(); },
+                              [this](const std::string& text) { _frontEnd.setStream(text); }});
     _frontEnd.resize(_terminal.columns(), _terminal.rows());
+    _ticking = _link.clock().scheduleRepeating(PallaxModel::kDisplayInterval, [this] { tick(); });
     waitForKey();
     return _session.run();
 }

@@ -10,8 +10,10 @@
 #include "travel/Travel.h"
 #include "ui/terminal/CursesTerminal.h"
 #include "ui/terminal/FrontEnd.h"
+#include "watching/AlarmWatch.h"
 
 #include <chrono>
+#include <cstdint>
 #include <memory>
 #include <optional>
 
@@ -41,6 +43,8 @@ private:
     terminal::FrontEnd::Surroundings frontEndSurroundings();
     void waitForKey();
     void readKey();
+    void begin(const std::string& technology);
+    void tick();
     void needsDisplay();
     void display();
     void keepTurning();
@@ -56,11 +60,14 @@ private:
     ViewedTimeline _timeline;
     Travel _travel;
     std::optional<std::chrono::steady_clock::time_point> _searchBegan; ///< while one goes on
+    AlarmWatch _alarms;
+    std::uint64_t _ticks = 0;
     std::optional<NetworkNames> _names; ///< read when the overview is drawn for the first time
     terminal::FrontEnd _frontEnd;
     HostFileSystem _files;
     FilePreferences _preferences;
     BrowsingSession _session;
+    std::unique_ptr<RepeatingTimer> _ticking;
     std::unique_ptr<RepeatingTimer> _turning; // while something on the screen turns
 };
 

@@ -1,8 +1,6 @@
 #include "cli/Amounts.h"
 
-#include <algorithm>
 #include <charconv>
-#include <cmath>
 #include <limits>
 #include <string_view>
 #include <system_error>
@@ -26,22 +24,6 @@ Result<std::uint64_t, std::string> parseSize(const std::string& text) {
         return "\"" + text + "\" is out of range, which is from 1 to 17179869183G";
     }
     return number << shift;
-}
-
-Result<std::chrono::nanoseconds, std::string> parseSeconds(const std::string& text) {
-    constexpr double kMost = 1e9; // about 30 years
-    double seconds = 0;
-    const char* end = text.data() + text.size();
-    const auto result = std::from_chars(text.data(), end, seconds);
-    if (result.ec == std::errc::invalid_argument || result.ptr != end || std::isnan(seconds)) {
-        return "\"" + text + "\" is not a number of seconds";
-    }
-    if (result.ec != std::errc() || seconds <= 0 || seconds > kMost) {
-        return "\"" + text + "\" is out of range, which is above 0 and up to 1000000000";
-    }
-    const std::chrono::duration<double> duration(seconds);
-    return std::max(std::chrono::duration_cast<std::chrono::nanoseconds>(duration),
-                    std::chrono::nanoseconds(1));
 }
 
 } // namespace pallax

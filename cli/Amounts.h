@@ -1,8 +1,8 @@
 #pragma once
 
 #include "text/Result.h"
+#include "text/SecondsText.h"
 
-#include <chrono>
 #include <cstdint>
 #include <string>
 
@@ -12,8 +12,5 @@ namespace pallax {
 /// "4096", "64k", "100M", "2G": bytes, in powers of 1024. For anything else, and for 0, what is
 /// wrong with it.
 Result<std::uint64_t, std::string> parseSize(const std::string& text);
-
-/// "0.5", "3600": above 0 and up to 1000000000; otherwise an error.
-Result<std::chrono::nanoseconds, std::string> parseSeconds(const std::string& text);
 
 } // namespace pallax

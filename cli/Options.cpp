@@ -189,6 +189,9 @@ void addLogLevel(CLI::App& app, std::optional<int>& level) {
 void addView(CLI::App& app, BrowseOptions& options) {
     app.add_flag("--print", options.print,
                  "Print the tree as text at each display tick (the default without a terminal)");
+    app.add_flag("--plain", options.plain,
+                 "Print what changes as sentences, for a screen reader, without a screen")
+        ->excludes("--print");
     addChoice<terminal::ColorUse>(app, "--color", options.color,
                                   {{"auto", terminal::ColorUse::Auto},
                                    {"always", terminal::ColorUse::Always},

@@ -4,6 +4,8 @@
 
 #include <CLI/CLI.hpp>
 
+#include <utility>
+
 namespace pallax {
 
 namespace {
@@ -12,6 +14,7 @@ constexpr const char* kWatchFooter = R"(Examples:
   pallax watch 'measured_rsrp < -110' drive.pcap
   pallax watch --for 10s "quality('rsrp', measured_rsrp) = 'poor'" drive.pcap
   pallax watch --once 'measured_rsrp < -110'
+  pallax watch --rule weak drive.pcap
   pallax watch --exec 'notify-send "RSRP $PALLAX_MEASURED_RSRP"' \
       'measured_rsrp < -110'
 
@@ -20,6 +23,9 @@ live modem, until Ctrl-C, the end of its source, or a change of its technology.
 The condition is an expression of SQL on a row of the table "state" of pallax
 sql: time, packet, tick, fields and their ages. It becomes true at the first
 tick at which it holds or, with --for, at which it has held for so long.
+
+With --rule, there is no CONDITION: the condition, and how long it must hold,
+are those of an alarm of pallax.conf(5).
 
 Each time it becomes true, a line has the local time, "holds" and the condition;
 when it no longer holds, a line has "ended" and for how long it held. Recordings
@@ -48,16 +54,31 @@ Exit status:
   2   wrong usage, or a wrong condition
   3   could not tell: a recording or the modem cannot be read; or failure)";
 
-/// A number of seconds, with or without the unit.
-std::chrono::nanoseconds durationOf(std::string text) {
-    if (text.size() > 1 && text.ends_with('s')) {
-        text.pop_back();
-    }
-    const auto seconds = parseSeconds(text);
+std::chrono::nanoseconds durationOf(const std::string& text) {
+    const auto seconds = parseSecondsWithUnit(text);
     if (!seconds) {
         throw CLI::ValidationError("--for", seconds.error());
     }
     return *seconds;
+}
+
+/// With a rule, there is no condition: all arguments are recordings.
+void addRule(CLI::App& app, WatchOptions& options, CLI::Option& condition) {
+    app.add_option_function<std::string>(
+           "--rule",
+           [&options, &condition](const std::string& name) {
+               options.rule = name;
+               condition.required(false);
+           },
+           "Look at this alarm of pallax.conf instead of CONDITION")
+        ->type_name("NAME")
+        ->excludes("--for");
+    app.callback([&options] {
+        if (options.rule && !options.condition.empty()) {
+            options.recordings.insert(options.recordings.begin(),
+                                      std::exchange(options.condition, {}));
+        }
+    });
 }
 
 } // namespace
@@ -72,7 +93,9 @@ void addWatch(CLI::App& app, WatchOptions& options) {
     app.add_option("--exec", options.command, "Run this command each time it becomes true")
         ->type_name("COMMAND");
     app.add_flag("--once", options.once, "End when it has become true");
-    app.add_option("CONDITION", options.condition, "The condition")->required()->type_name("");
+    CLI::Option* condition = app.add_option("CONDITION", options.condition, "The condition");
+    condition->required()->type_name("");
+    addRule(app, options, *condition);
     app.add_option("RECORDING", options.recordings,
                    "Recordings (pcap or pcapng; - is standard input; default: the live modem)")
         ->type_name("");

@@ -93,10 +93,10 @@ constexpr auto kRows = std::to_array<EventFields>({
     {"utran", Watch::Contexts, "context", kUtranContexts},
 });
 
-constexpr std::array<std::string_view, 11> kWords{
+constexpr std::array<std::string_view, 12> kWords{
     "cell-change",  "ping-pong",        "state-change", "technology-change",
     "service-lost", "service-regained", "context-up",   "context-down",
-    "gap",          "time-step",        "fatal-record",
+    "gap",          "time-step",        "fatal-record", "alarm",
 };
 
 } // namespace

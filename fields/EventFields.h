@@ -17,6 +17,7 @@ enum class EventKind {
     Gap,
     TimeStep,
     FatalRecord,
+    Alarm, ///< a viewer's: recordings have none
 };
 
 /// "cell-change": one word, for tables and programs.

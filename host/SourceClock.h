@@ -58,6 +58,8 @@ public:
     void stampRemark(std::uint32_t packet, const StampRemark& remark) override;
     void sourceEnded() override;
 
+    /// Whether the present source is a live one.
+    bool isLive() const { return _isLive; }
     /// The number of the latest packet in its source, counted from 1; 0 if unknown.
     std::uint32_t packetNumber() const { return _packetNumber; }
     /// The latest source time as received, which for a packet is its stamp; `now` before the first.

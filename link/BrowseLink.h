@@ -12,7 +12,9 @@
 #include "telephony/SocketTelephonyService.h"
 
 #include <chrono>
+#include <cstdint>
 #include <string>
+#include <string_view>
 
 namespace pallax {
 
@@ -40,6 +42,10 @@ public:
     ModemLink::Platform platform();
     /// See LinkPorts.
     const std::string& obstacle() const { return _linkPorts.obstacle(); }
+
+    /// See LinkPorts.
+    std::string_view briefObstacle() const { return _linkPorts.briefObstacle(); }
+    std::uint64_t received() const { return _linkPorts.received(); }
 
     bool hasChild() const { return _child != nullptr; }
     /// True once the child has ended; its owner must reap it.

@@ -15,6 +15,7 @@ constexpr const char* kNoService = "No telephony service is running";
 constexpr const char* kNoAnswer = "The telephony service does not answer";
 constexpr const char* kBusy = "The telephony service is busy with other clients";
 constexpr const char* kNothingToPlay = "The telephony service has nothing to play to this client";
+constexpr const char* kRefused = "The telephony service refuses a log channel";
 constexpr const char* kNoTechnology = "The modem's technology is unknown";
 
 /// Why a request for a log channel failed.
@@ -28,8 +29,9 @@ std::string refusal(const LogChannel& channel) {
     case EIO:
         return kNothingToPlay;
     default:
-        return formatText("The telephony service refuses a log channel: %@",
-                          {std::strerror(channel.errorCode)}); // NOLINT(concurrency-mt-unsafe)
+        return formatText(
+            "%@: %@",
+            {kRefused, std::strerror(channel.errorCode)}); // NOLINT(concurrency-mt-unsafe)
     }
 }
 
@@ -63,7 +65,12 @@ private:
     LinkPorts& _link;
 };
 
-MessagePorts::Local LinkPorts::createLocal(std::string_view name, ReceiveCallback receive) {
+MessagePorts::Local LinkPorts::createLocal(std::string_view name, ReceiveCallback callback) {
+    ReceiveCallback receive = [this, callback = std::move(callback)](std::int32_t identifier,
+                                                                     Bytes data) {
+        ++_received;
+        return callback(identifier, data);
+    };
     _localName = name;
     Local local = _setup.ports.createLocal(_localName, receive);
     if (local.alreadyExisted) {
@@ -76,6 +83,23 @@ MessagePorts::Local LinkPorts::createLocal(std::string_view name, ReceiveCallbac
         _obstacle = formatText("The message port %@ exists already", {_localName});
     }
     return local;
+}
+
+std::string_view LinkPorts::briefObstacle() const {
+    constexpr std::pair<std::string_view, std::string_view> kBrief[] = {
+        {"", ""},
+        {kNoService, "no service"},
+        {kNoAnswer, "no answer"},
+        {kBusy, "service is busy"},
+        {kNothingToPlay, "nothing to play"},
+        {kNoTechnology, "unknown technology"},
+    };
+    for (const auto& [sentence, brief] : kBrief) {
+        if (_obstacle == sentence) {
+            return brief;
+        }
+    }
+    return _obstacle.starts_with(kRefused) ? "service refuses" : "no message port";
 }
 
 std::unique_ptr<HXServerConnection> LinkPorts::connect(std::function<void()> notification) {

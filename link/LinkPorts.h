@@ -3,8 +3,10 @@
 #include "platform/MessagePort.h"
 #include "platform/TelephonyService.h"
 
+#include <cstdint>
 #include <functional>
 #include <string>
+#include <string_view>
 
 namespace pallax {
 
@@ -35,6 +37,10 @@ public:
     /// The last problem of the latest start ("No telephony service is running"), for a link that is
     /// not connected; empty before the first start.
     const std::string& obstacle() const { return _obstacle; }
+    /// The same in two or three words: "no service".
+    std::string_view briefObstacle() const;
+    /// The number of messages that have arrived at the local ports.
+    std::uint64_t received() const { return _received; }
 
 private:
     class Connection;
@@ -42,6 +48,7 @@ private:
     Setup _setup;
     std::string _localName; ///< in place of the model's
     std::string _obstacle;
+    std::uint64_t _received = 0;
 };
 
 } // namespace pallax

@@ -11,6 +11,7 @@
 #include <cstdint>
 #include <filesystem>
 #include <system_error>
+#include <utility>
 
 namespace pallax {
 
@@ -94,6 +95,18 @@ std::optional<std::string> takeNumber(Settings& settings, const NumberSetting& s
     return std::nullopt;
 }
 
+std::optional<std::string> takeAlarm(Settings& settings, std::string_view text) {
+    auto rule = parseAlarmRule(text);
+    if (!rule) {
+        return rule.error();
+    }
+    if (alarmNamed(settings.alarms, rule->name) != nullptr) {
+        return formatText("there is already an alarm \"%@\"", {rule->name});
+    }
+    settings.alarms.push_back(std::move(rule).value());
+    return std::nullopt;
+}
+
 /// Sets one setting; returns the reason if it cannot.
 std::optional<std::string> take(Settings& settings, std::string_view key, std::string_view value) {
     for (const ChoiceSetting& setting : kChoiceSettings) {
@@ -105,6 +118,9 @@ std::optional<std::string> take(Settings& settings, std::string_view key, std::s
         if (key == setting.key) {
             return takeNumber(settings, setting, value);
         }
+    }
+    if (key == "alarm") {
+        return takeAlarm(settings, value);
     }
     if (key != "snapshot-directory" && key != "save-button-marker") {
         return formatText("there is no setting \"%@\"", {key});

@@ -3,6 +3,7 @@
 #include "console/ScopedLog.h"
 #include "decoding/FatalRecord.h"
 #include "host/BoundedJournal.h"
+#include "link/AlarmRule.h"
 #include "text/Result.h"
 
 #include <cstddef>
@@ -33,6 +34,7 @@ struct Settings {
     std::optional<std::string> saveButtonMarker;          ///< save-button-marker = PATH
     int systemLogLevel = kSyslogLevel;                    ///< system-log-level = 0 ... 7
     BoundedJournal::Limits journal = {};                  ///< journal-hours, journal-mebibytes
+    std::vector<AlarmRule> alarms = {};                   ///< alarm = RULE, any number of times
 };
 
 /// One sentence that names file and line.

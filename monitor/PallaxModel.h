@@ -66,6 +66,9 @@ public:
     /// The live display, up to date with the latest packet; null while there is none.
     PropertyList display() { return _driver.display(); }
 
+    /// When the values of the live display were last read.
+    SectionAges sectionAges() { return _driver.sectionAges(); }
+
     /// While the observer lives, it gets the frame of each display tick with new data, after the
     /// model's own observer was called. The model makes frames only while they are observed, from
     /// the tree of `topLevelNodes`.

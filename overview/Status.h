@@ -4,11 +4,15 @@
 #include "knowledge/Quality.h"
 #include "timeline/CurrentValues.h"
 
+#include <chrono>
 #include <optional>
 #include <string>
 #include <vector>
 
 namespace pallax {
+
+/// A value that was read longer ago is old.
+inline constexpr std::chrono::seconds kFresh{10};
 
 /// A value with what a reader wants to know about it.
 struct StatusValue {
@@ -18,7 +22,17 @@ struct StatusValue {
     double number = 0.0;
     std::optional<Grade> grade; ///< nothing where the profile does not judge the field
     Time read;
+    /// A value that was read longer ago is overdue; nothing if it is not known how often it comes.
+    std::optional<std::chrono::nanoseconds> patience = {};
 };
+
+inline bool isOverdue(Time now, const StatusValue& value) {
+    return value.patience && now - value.read > *value.patience;
+}
+/// An overdue value is also old.
+inline bool isOld(Time now, const StatusValue& value) {
+    return now - value.read > kFresh || isOverdue(now, value);
+}
 
 struct StatusCell {
     std::string system;                ///< "LTE"
@@ -65,9 +79,6 @@ struct Status {
                contexts.empty();
     }
 };
-
-/// A value that was read longer ago is old.
-inline constexpr std::chrono::seconds kFresh{10};
 
 /// `time` is that of the values.
 Status statusOf(const CurrentValues& values, Time time, const NetworkNames& names,

@@ -5,6 +5,7 @@
 #include "timeline/Instants.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace pallax {
 
@@ -53,8 +54,38 @@ bool StatusWatch::namesCell(const std::string& path) const {
 
 Overview StatusWatch::overview(Time time, const NetworkNames& names,
                                const QualityProfile& profile) const {
-    return _known ? Overview{statusOf(_known->values, time, names, profile), _known->events}
-                  : Overview();
+    if (!_known) {
+        return {};
+    }
+    Overview overview{statusOf(_known->values, time, names, profile), _known->events};
+    for (StatusCell& cell : overview.status.cells) {
+        for (auto* values : {&cell.identity, &cell.levels}) {
+            for (StatusValue& value : *values) {
+                addPatience(value);
+            }
+        }
+        if (cell.channel) {
+            addPatience(*cell.channel);
+        }
+    }
+    return overview;
+}
+
+void StatusWatch::addPatience(StatusValue& value) const {
+    const auto field = _known->fields.named(value.field);
+    if (field && *field < _known->arrivals.size()) {
+        value.patience = _known->arrivals[*field].patience();
+    }
+}
+
+void StatusWatch::valueRead(FieldIndex field, EntryId entry, const FieldValue& value) {
+    _known->finder.valueRead(field, value);
+    if (entry == kNoEntry) {
+        if (field >= _known->arrivals.size()) {
+            _known->arrivals.resize(_known->fields.size());
+        }
+        _known->arrivals[field].note(value.read);
+    }
 }
 
 void StatusWatch::beginPacket(const SamplePacket& packet) {
@@ -73,8 +104,20 @@ void StatusWatch::endPacket() {
     if (!_known) {
         return;
     }
+    _known->finder.endPacket(_known->packet.number, _known->packet.time, _known->values,
+                             _known->events);
+    forgetEarlyEvents();
+}
+
+void StatusWatch::add(Event event) {
+    if (_known) {
+        _known->events.push_back(std::move(event));
+        forgetEarlyEvents();
+    }
+}
+
+void StatusWatch::forgetEarlyEvents() {
     std::vector<Event>& events = _known->events;
-    _known->finder.endPacket(_known->packet.number, _known->packet.time, _known->values, events);
     if (events.size() > kMostEvents) {
         events.erase(events.begin(), events.end() - kMostEvents);
     }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "monitor/Arrivals.h"
 #include "overview/Status.h"
 #include "packets/StampSequence.h"
 #include "timeline/Event.h"
@@ -44,6 +45,10 @@ public:
     /// cell an entry is, by its path in the display: "/Neighbor Cells List/*/Physical Cell ID".
     bool identifies(const std::string& path) const;
     bool namesCell(const std::string& path) const;
+    /// The current values; null without a technology. Valid until the next `begin`.
+    const CurrentValues* values() const { return _known ? &_known->values : nullptr; }
+    /// Adds an event that the samples do not tell. Nothing happens without a technology.
+    void add(Event event);
 
     Overview overview(Time time, const NetworkNames& names, const QualityProfile& profile) const;
 
@@ -81,7 +86,8 @@ private:
         CurrentValues values;
         EventFinder finder;
         StampSequence stamps;
-        SamplePacket packet; ///< the current one
+        SamplePacket packet;            ///< the current one
+        std::vector<Arrivals> arrivals; ///< by field; of fields that are not in a list
         std::vector<Event> events;
     };
 
@@ -91,9 +97,10 @@ private:
             samples(_known->values);
         }
     }
-    void valueRead(FieldIndex field, EntryId /*entry*/, const FieldValue& value) override {
-        _known->finder.valueRead(field, value);
-    }
+    void valueRead(FieldIndex field, EntryId entry, const FieldValue& value) override;
+    void forgetEarlyEvents();
+    /// Adds how long the value may be missing.
+    void addPatience(StatusValue& value) const;
     void valueRemoved(FieldIndex field) override { _known->finder.valueRemoved(field); }
     void listReplaced(ListId list) override { _known->finder.listReplaced(list); }
 

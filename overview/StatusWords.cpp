@@ -2,7 +2,7 @@
 
 #include "fields/Measures.h"
 #include "knowledge/Channels.h"
-#include "text/Format.h"
+#include "text/AgeText.h"
 
 #include <algorithm>
 #include <cmath>
@@ -61,23 +61,17 @@ std::string_view qualityWord(const StatusValue& value) {
 }
 
 std::string ageWords(std::chrono::nanoseconds age) {
-    using namespace std::chrono;
-    if (age < minutes(2)) {
-        return formatText("%lld s ago", {round<seconds>(age).count()});
-    }
-    if (age < hours(2)) {
-        return formatText("%lld min ago", {floor<minutes>(age).count()});
-    }
-    return age < days(2) ? formatText("%lld h ago", {floor<hours>(age).count()})
-                         : formatText("%lld days ago", {floor<days>(age).count()});
+    return ageText(age) + " ago";
 }
 
 std::string oldAgeWords(Time now, const std::vector<const StatusValue*>& values) {
     std::chrono::nanoseconds oldest{0};
     for (const StatusValue* value : values) {
-        oldest = std::max<std::chrono::nanoseconds>(oldest, now - value->read);
+        if (isOld(now, *value)) {
+            oldest = std::max<std::chrono::nanoseconds>(oldest, now - value->read);
+        }
     }
-    return oldest > kFresh ? ageWords(oldest) : "";
+    return oldest > std::chrono::nanoseconds::zero() ? ageWords(oldest) : "";
 }
 
 std::optional<double> shareOf(const StatusValue& level) {

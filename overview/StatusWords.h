@@ -26,7 +26,7 @@ std::string contextWords(const StatusContext& context);
 std::string_view qualityWord(const StatusValue& value);
 /// "12 s ago".
 std::string ageWords(std::chrono::nanoseconds age);
-/// The age of the oldest of the values, if it is old; otherwise empty.
+/// The age of the oldest of the values that are old; empty if none is.
 std::string oldAgeWords(Time now, const std::vector<const StatusValue*>& values);
 
 /// How far a level is from the worst to the best value of its measure, from 0 to 1; nothing for a

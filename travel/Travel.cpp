@@ -2,6 +2,7 @@
 
 #include "packets/StampSequence.h"
 #include "query/Condition.h"
+#include "text/AgeText.h"
 #include "text/Format.h"
 #include "timeline/Instants.h"
 #include "timeline/Timeline.h"
@@ -18,20 +19,6 @@ constexpr const char* kNoPacket = "No packet has come yet.";
 constexpr int kFastest = 8; // 256 times
 constexpr int kSlowest = -3;
 constexpr std::chrono::seconds kShownPause{2}; // how much of a pause is played
-
-/// "12 s", "3 min", "2 h", "5 days".
-std::string lengthText(std::chrono::nanoseconds length) {
-    using namespace std::chrono;
-    const auto whole = round<seconds>(length);
-    if (whole < minutes(2)) {
-        return formatText("%lld s", {whole.count()});
-    }
-    if (whole < hours(2)) {
-        return formatText("%lld min", {floor<minutes>(whole).count()});
-    }
-    return whole < days(2) ? formatText("%lld h", {floor<hours>(whole).count()})
-                           : formatText("%lld days", {floor<days>(whole).count()});
-}
 
 TimeSpan spanOf(const Timeline& timeline) {
     TimeSpan span{timeline.stretches().front().first, timeline.stretches().front().latest, {}};
@@ -352,9 +339,9 @@ std::string Travel::words() const {
     std::string words = _playing ? "playing " + speedText() : "held";
     const std::chrono::nanoseconds behind = _surroundings.now() - *shownTime;
     if (behind >= std::chrono::seconds(1)) {
-        words += ", " + lengthText(behind) + " behind";
+        words += ", " + ageText(behind) + " behind";
     } else if (-behind >= std::chrono::seconds(1)) {
-        words += ", " + lengthText(-behind) + " ahead";
+        words += ", " + ageText(-behind) + " ahead";
     }
     return words;
 }

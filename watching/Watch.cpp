@@ -13,6 +13,7 @@
 #include "link/Settings.h"
 #include "link/WaitNotice.h"
 #include "live/LiveRecording.h"
+#include "text/Format.h"
 #include "watching/ShellCommand.h"
 #include "watching/WatchCommand.h"
 
@@ -82,10 +83,40 @@ ExitStatus watchRecordings(const WatchOptions& options) {
     return watchWith(options, open, ShellCommand::Mode::Wait);
 }
 
+struct RuleError {
+    std::string sentence;
+    ExitStatus status;
+};
+
+/// The options with the condition of the rule that they name, if they name one.
+Result<WatchOptions, RuleError> withRule(WatchOptions options) {
+    if (!options.rule) {
+        return options;
+    }
+    const SettingsResult settings = loadSettings(settingsFiles());
+    if (!settings) {
+        return RuleError{settings.error().sentence, kExitCouldNotTell};
+    }
+    const AlarmRule* rule = alarmNamed(settings->alarms, *options.rule);
+    if (rule == nullptr) {
+        return RuleError{formatText("--rule: pallax.conf has no alarm \"%@\".", {*options.rule}),
+                         kExitWrongUsage};
+    }
+    options.condition = rule->condition;
+    options.needed = rule->needed;
+    return options;
+}
+
 } // namespace
 
-ExitStatus runWatch(const WatchOptions& options) {
+ExitStatus runWatch(const WatchOptions& wanted) {
     try {
+        const auto ruled = withRule(wanted);
+        if (!ruled) {
+            complain(ruled.error().sentence);
+            return ruled.error().status;
+        }
+        const WatchOptions& options = *ruled;
         return options.recordings.empty() ? watchLive(options) : watchRecordings(options);
     } catch (const OutputClosed&) {
         return kExitFailure; // only what has become true is written

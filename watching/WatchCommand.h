@@ -24,7 +24,8 @@ struct WatchOptions {
     const RecordedTechnology* technology = nullptr;
     std::chrono::nanoseconds needed{}; ///< how long the condition must hold to be true
     std::optional<std::string> command = {};
-    bool once = false; ///< ends when it has become true
+    bool once = false;                    ///< ends when it has become true
+    std::optional<std::string> rule = {}; ///< the name of an alarm, in place of the condition
 };
 
 /// Writes a line each time the condition becomes true at a tick, and one when it ends. The numbered

@@ -1,5 +1,8 @@
 #include "app/pane/PaneChanges.h"
 
+#include "app/pane/PaneRow.h"
+
+#include <unordered_set>
 #include <utility>
 
 namespace pallax {
@@ -37,6 +40,25 @@ PaneChanges::Change PaneChanges::changeOf(const PallaxModelNode& leaf, std::size
         _changed.insert_or_assign(&leaf, *change.at);
     }
     return change;
+}
+
+std::vector<std::string> PaneChanges::gone(const PallaxModelNode& now) const {
+    std::vector<std::string> names;
+    if (!_before || _before->childNodes() == nullptr || elementsOf(*_before)) {
+        return names;
+    }
+    std::unordered_set<std::string_view> present;
+    if (const std::vector<NodeRef>* children = now.childNodes()) {
+        for (const NodeRef& child : *children) {
+            present.insert(child->displayName());
+        }
+    }
+    for (const NodeRef& child : *_before->childNodes()) {
+        if (!present.contains(child->displayName())) {
+            names.push_back(child->displayName());
+        }
+    }
+    return names;
 }
 
 const PallaxModelNode* PaneChanges::namedBefore(std::string_view name, std::size_t row) const {

@@ -5,8 +5,10 @@
 
 #include <cstddef>
 #include <optional>
+#include <string>
 #include <string_view>
 #include <unordered_map>
+#include <vector>
 
 namespace pallax {
 
@@ -24,6 +26,9 @@ public:
     /// The change of a leaf that is now in that row. It has changed if the previous data had
     /// another value of that name, or none. Nothing has changed while there is no previous data.
     Change changeOf(const PallaxModelNode& leaf, std::size_t row) const;
+
+    /// The names of the previous children that `now` has no longer; none of a list's elements.
+    std::vector<std::string> gone(const PallaxModelNode& now) const;
 
 private:
     using Times = std::unordered_map<const PallaxModelNode*, Time>;

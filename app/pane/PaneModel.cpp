@@ -1,6 +1,8 @@
 #include "app/pane/PaneModel.h"
 
 #include "app/pane/FindIgnoringCase.h"
+#include "text/AgeText.h"
+#include "text/Format.h"
 
 #include <algorithm>
 #include <utility>
@@ -56,6 +58,10 @@ PaneRow PaneModel::row(std::size_t row) const {
     }
     made.name = node->displayName();
     made.readAt = node->readAt();
+    if (_ages) {
+        const auto age = _ages(childPath(_path, made.name));
+        made.overdue = age && age->isOverdue ? std::optional(age->age) : std::nullopt;
+    }
     if (node->childNodes() != nullptr) {
         made.isBranch = true;
         made.elements = elementsOf(*node);
@@ -70,6 +76,19 @@ PaneRow PaneModel::row(std::size_t row) const {
     made.hasChanged = change.hasChanged;
     made.changedAt = change.at;
     return made;
+}
+
+std::string PaneModel::emptyWords() const {
+    const bool isAsked = _node && _ages && totalRows() == 0;
+    if (!isAsked) {
+        return "";
+    }
+    const auto age = _ages(_path);
+    return age ? formatText("Reported empty %@ ago.", {ageText(age->age)}) : "Never reported.";
+}
+
+std::vector<std::string> PaneModel::gone() const {
+    return _node ? _changes.gone(*_node) : std::vector<std::string>();
 }
 
 void PaneModel::setFilter(std::string text) {

@@ -3,11 +3,13 @@
 #include "app/pane/PaneChanges.h"
 #include "app/pane/PaneOrder.h"
 #include "app/pane/PaneRow.h"
+#include "app/pane/ReadingAge.h"
 
 #include <cstddef>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 namespace pallax {
@@ -38,6 +40,14 @@ public:
     /// Shows a new node at the path, or null. `time` is the time of its data. The previous node is
     /// kept to tell what has changed. Showing the same node again does not count as new data.
     void show(NodeRef node, std::optional<Time> time = {});
+
+    /// Where the ages of the rows come from.
+    void setAges(ReadingAges ages) { _ages = std::move(ages); }
+    /// Why a pane without rows has none, in words; empty if it has rows or the ages are unknown.
+    std::string emptyWords() const;
+    /// The names of the values that the previous data had and the current data has not, in their
+    /// order. The elements of a list have no names.
+    std::vector<std::string> gone() const;
 
     std::size_t totalRows() const;
     /// The node of a row; null beyond the last row.
@@ -80,6 +90,7 @@ private:
     std::string _status;
     bool _isLoading = true;
     PaneChanges _changes;
+    ReadingAges _ages;
     std::string _filter;
     PaneOrder _order;
     std::vector<std::size_t> _shown; ///< unused while all rows are shown in the display's order

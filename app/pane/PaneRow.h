@@ -3,6 +3,7 @@
 #include "app/tree/PallaxModelNode.h"
 #include "text/Date.h"
 
+#include <chrono>
 #include <cstddef>
 #include <optional>
 #include <string>
@@ -28,6 +29,8 @@ struct PaneRow {
     std::optional<Time> changedAt;
     /// As PallaxModelNode::readAt.
     std::optional<Time> readAt;
+    /// How long ago the row was read, if that is longer than usual.
+    std::optional<std::chrono::nanoseconds> overdue;
 };
 
 /// The value of a leaf as text; nothing for a branch.

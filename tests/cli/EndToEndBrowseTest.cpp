@@ -63,6 +63,23 @@ TEST_F(EndToEndBrowse, ARecordingIsPrintedAtTheTicksOfItsOwnTime) {
     EXPECT_TRUE(nothingLeft());
 }
 
+TEST_F(EndToEndBrowse, PlainOutputTellsOnlyWhatChanges) {
+    const std::string recording =
+        record("plain.pcap", {{std::chrono::seconds(0), registration(0)},
+                              {std::chrono::seconds(3), registration(2)},
+                              {std::chrono::seconds(5), registration(2)}});
+    const Run played = run({recording, "--plain", "--speed", "max"});
+    EXPECT_EQ(played.status, 0) << played.err;
+    constexpr std::string_view kChange =
+        "In Process CO:\nMM Service State: REG_STATE_REGISTERING\n";
+    const std::size_t at = played.out.find(kChange);
+    ASSERT_NE(at, std::string::npos) << played.out;
+    EXPECT_NE(played.out.find("\nMM Service State: REG_STATE_INACTIVE\n"), std::string::npos);
+    EXPECT_EQ(played.out.find("In Process CO", at + 1), std::string::npos) << "no other change";
+    EXPECT_EQ(played.out.find("=="), std::string::npos);
+    EXPECT_TRUE(nothingLeft());
+}
+
 TEST_F(EndToEndBrowse, TheTicksAreThoseOfDecode) {
     const std::string recording = gsmAttach();
     const Run decoded = run({"decode", "--every", "tick", recording});

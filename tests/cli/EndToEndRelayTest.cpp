@@ -1,6 +1,7 @@
 #include "host/Descriptor.h"
 #include "host/Recording.h"
 #include "tests/cli/EndToEnd.h"
+#include "tests/cli/PallaxTerminal.h"
 
 #include <algorithm>
 #include <csignal>
@@ -63,6 +64,18 @@ protected:
     std::unique_ptr<RecordingWriter> device;
     std::optional<PallaxProcess> service;
 };
+
+TEST_F(EndToEndRelay, AViewersTitleTellsThatAStreamIsSilent) {
+    PallaxTerminal terminal(world, {}, {});
+    ASSERT_TRUE(clientsStream(1));
+    send(seconds(0), 2);
+    EXPECT_TRUE(terminal.shows("Updated "));
+    EXPECT_TRUE(terminal.shows("no data for 7 s"));
+    send(seconds(3), 2);
+    EXPECT_TRUE(terminal.showsNoMore("no data for"));
+    terminal.type("q");
+    EXPECT_EQ(terminal.wait(), 0);
+}
 
 TEST_F(EndToEndRelay, AStreamGoesToEveryClientAsItComesAndTheServiceEndsWithIt) {
     PallaxProcess viewer(world, {"--log-level", "3"});

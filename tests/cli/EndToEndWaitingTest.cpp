@@ -65,8 +65,10 @@ TEST_F(EndToEndWaiting, AViewerThatPrintsSaysItOnStandardError) {
 TEST_F(EndToEndWaiting, AViewerOnTheScreenSaysItInTheStatusUntilItIsConnected) {
     PallaxTerminal terminal(world, {}, {});
     EXPECT_TRUE(terminal.shows(kNoService));
+    EXPECT_TRUE(terminal.shows("connecting: no service"));
     PallaxProcess source(world, service());
     EXPECT_TRUE(terminal.shows("Updated "));
+    EXPECT_TRUE(terminal.showsNoMore("connecting:"));
     EXPECT_TRUE(terminal.showsNoMore(kNoService));
     source.signal(SIGKILL);
     EXPECT_EQ(source.wait(), -SIGKILL);

@@ -221,6 +221,25 @@ TEST_F(EndToEndWatch, ASignalDoesNotWaitForTheCommand) {
     end(service);
 }
 
+TEST_F(EndToEndWatch, ARuleOfTheSettingsIsTriedOnARecording) {
+    std::filesystem::create_directories(world.path("config/pallax"));
+    std::ofstream(world.path("config/pallax/pallax.conf"))
+        << "alarm = registers: " << kRegisters << " for 4s bell\n";
+    const Run found = run({"watch", "--rule", "registers", twice()});
+    EXPECT_EQ(found.status, 1);
+    EXPECT_EQ(found.out, run({"watch", "--for", "4s", kRegisters, twice()}).out);
+    EXPECT_EQ(found.out, line("22:13:28", "holds") + line("22:13:30", "ended", " (held for 6 s)"));
+    EXPECT_EQ(found.err, "");
+    const Run missing = run({"watch", "--rule", "register", twice()});
+    EXPECT_EQ(missing.status, 2);
+    EXPECT_EQ(missing.err, "pallax: --rule: pallax.conf has no alarm \"register\".\n");
+    std::ofstream(world.path("config/pallax/pallax.conf")) << "alarm\n";
+    const Run unreadable = run({"watch", "--rule", "registers", twice()});
+    EXPECT_EQ(unreadable.status, 3);
+    EXPECT_EQ(unreadable.err, "pallax: " + world.path("config/pallax/pallax.conf") +
+                                  ", line 1: a setting is written \"key = value\".\n");
+}
+
 TEST_F(EndToEndWatch, OfTheLiveModemNeedsReadableSettings) {
     const std::string file = world.path("config/pallax/pallax.conf");
     std::filesystem::create_directories(world.path("config/pallax"));

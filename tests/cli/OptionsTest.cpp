@@ -23,6 +23,10 @@ TEST(Options, ARecordingIsBrowsed) {
         {"drive.pcap", "--print", "--speed", "2.5", "--loop", "--keep-going", "--log-level", "4"});
     EXPECT_EQ(recordingPath(options.source), "drive.pcap");
     EXPECT_TRUE(options.print);
+    EXPECT_FALSE(options.plain);
+    EXPECT_TRUE(parsed<BrowseOptions>({"drive.pcap", "--plain"}).plain);
+    const ParsedOptions both = parseOptions({"drive.pcap", "--plain", "--print"});
+    EXPECT_EQ(std::get<ParseEnd>(both).status, kExitWrongUsage);
     EXPECT_EQ(options.play.speed, 2.5);
     EXPECT_TRUE(options.play.loop);
     EXPECT_TRUE(options.keepGoing);

@@ -141,6 +141,12 @@ TEST(Options, WatchTakesAConditionAndRecordings) {
     EXPECT_EQ(all.command, "echo \"$X\"");
     EXPECT_TRUE(all.once);
     EXPECT_EQ(parsed<WatchOptions>({"watch", "--for", "0.5", "a"}).needed, 500ms);
+    const auto rule = parsed<WatchOptions>({"watch", "--rule", "weak", "b.pcap", "c.pcap"});
+    EXPECT_EQ(rule.rule, "weak");
+    EXPECT_EQ(rule.condition, "");
+    EXPECT_EQ(rule.recordings, (std::vector<std::string>{"b.pcap", "c.pcap"}));
+    EXPECT_TRUE(parsed<WatchOptions>({"watch", "--rule", "weak"}).recordings.empty());
+    EXPECT_EQ(ended({"watch", "--rule", "weak", "--for", "10"}).status, kExitWrongUsage);
     EXPECT_EQ(ended({"watch"}).text, "pallax: CONDITION is required (see pallax watch --help)\n");
     for (const std::string wrong : {"10m", "s", "0s", "1ss"}) {
         const ParseEnd end = ended({"watch", "--for", wrong, "a"});

@@ -84,6 +84,7 @@ TEST_F(LinkPortsTest, WhereTheFixedNameIsTakenTheNextViewerHasANameOfItsOwn) {
     ports.deliver({1}); // to the model, through its own name
     queue.runReady();
     EXPECT_EQ(ports.replies().size(), 1U);
+    EXPECT_EQ(_link.received(), 1U);
 }
 
 TEST_F(LinkPortsTest, EachStartChoosesItsName) {
@@ -100,23 +101,27 @@ TEST_F(LinkPortsTest, WhereBothNamesAreTakenTheStartFailsAndIsTriedAgain5Seconds
     EXPECT_EQ(failedStart(), (Diary{"Local messsage port already exists",
                                     "Could not create the ports necessary"}));
     EXPECT_EQ(_link.obstacle(), "The message port own exists already");
+    EXPECT_EQ(_link.briefObstacle(), "no message port");
     EXPECT_TRUE(retriesAfter5Seconds());
 }
 
 TEST_F(LinkPortsTest, WhatAStartHasFailedAtIsRemembered) {
     EXPECT_EQ(_link.obstacle(), "");
+    EXPECT_EQ(_link.briefObstacle(), "");
     ports.failLocal = true;
     _whyNoPort = "The message port x cannot be made at /x: No such file or directory.";
     EXPECT_EQ(failedStart(), (Diary{"Could not create local message port",
                                     "Could not create the ports necessary"}));
     EXPECT_EQ(_link.obstacle(),
               "The message port x cannot be made at /x: No such file or directory");
+    EXPECT_EQ(_link.briefObstacle(), "no message port");
     ports.failLocal = false;
 
     telephony.reachable = false;
     EXPECT_EQ(failedStart(), (Diary{"Could not create HXServerConnection",
                                     "Could not create the ports necessary"}));
     EXPECT_EQ(_link.obstacle(), "No telephony service is running");
+    EXPECT_EQ(_link.briefObstacle(), "no service");
     _isServiceThere = true;
     (void)failedStart();
     EXPECT_EQ(_link.obstacle(), "The telephony service does not answer");
@@ -130,6 +135,7 @@ TEST_F(LinkPortsTest, WhatAStartHasFailedAtIsRemembered) {
     reply = {SendError::ReplyTimedOut, std::nullopt};
     (void)failedStart();
     EXPECT_EQ(_link.obstacle(), "The modem's technology is unknown");
+    EXPECT_EQ(_link.briefObstacle(), "unknown technology");
 }
 
 TEST_F(LinkPortsTest, WhyTheServiceGivesNoLogChannelIsToldInWords) {
@@ -140,11 +146,15 @@ TEST_F(LinkPortsTest, WhyTheServiceGivesNoLogChannelIsToldInWords) {
     };
     EXPECT_EQ(obstacle(kServiceErrorDomain, EMFILE),
               "The telephony service is busy with other clients");
+    EXPECT_EQ(_link.briefObstacle(), "service is busy");
     EXPECT_EQ(obstacle(kServiceErrorDomain, EIO),
               "The telephony service has nothing to play to this client");
+    EXPECT_EQ(_link.briefObstacle(), "nothing to play");
     EXPECT_EQ(obstacle(kServiceErrorDomain, ECONNREFUSED),
               "The telephony service refuses a log channel: Connection refused");
+    EXPECT_EQ(_link.briefObstacle(), "service refuses");
     EXPECT_EQ(obstacle(kPortErrorDomain, 2), "The telephony service does not answer");
+    EXPECT_EQ(_link.briefObstacle(), "no answer");
 }
 
 } // namespace

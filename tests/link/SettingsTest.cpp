@@ -29,6 +29,8 @@ TEST(Settings, AreReadLineByLine) {
                                         "lists = table\n"
                                         "journal-hours = 2\n"
                                         "journal-mebibytes = 65536\n"
+                                        "alarm = weak: measured_rsrp < -110 for 10s bell\n"
+                                        "alarm = lost: a = 'b = c'\n"
                                         "save-button-marker = /tmp/marker",
                                         "pallax.conf");
     ASSERT_TRUE(settings);
@@ -41,6 +43,9 @@ TEST(Settings, AreReadLineByLine) {
     EXPECT_EQ(settings->lists, Lists::Table);
     EXPECT_EQ(settings->journal.age, std::chrono::hours(2));
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{64} << 30U);
+    ASSERT_EQ(settings->alarms.size(), 2U);
+    EXPECT_EQ(settings->alarms[0].name, "weak");
+    EXPECT_EQ(settings->alarms[1].condition, "a = 'b = c'");
     EXPECT_EQ(parseSettings("after-reconnect = keep", "pallax.conf")->afterReconnect,
               AfterReconnect::Keep);
     EXPECT_EQ(parseSettings("first-screen = panes", "pallax.conf")->firstScreen,
@@ -60,6 +65,7 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
     EXPECT_EQ(settings->lists, Lists::Rows);
     EXPECT_EQ(settings->journal.age, std::chrono::hours(24));
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{256} << 20U);
+    EXPECT_TRUE(settings->alarms.empty());
 }
 
 TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
@@ -73,6 +79,12 @@ TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
               "pallax.conf, line 1: first-screen is \"panes\" or \"overview\", not \"graph\".");
     EXPECT_EQ(sentenceFor("lists = grid"),
               "pallax.conf, line 1: lists is \"rows\" or \"table\", not \"grid\".");
+    EXPECT_EQ(sentenceFor("\nalarm = weak"),
+              "pallax.conf, line 2: an alarm is written \"NAME: CONDITION [for SECONDS] [bell]\".");
+    EXPECT_EQ(sentenceFor("alarm = a: x <"),
+              "pallax.conf, line 1: alarm \"a\": This is not a whole condition.");
+    EXPECT_EQ(sentenceFor("alarm = a: x\nalarm = b: x\nalarm = a: y"),
+              "pallax.conf, line 3: there is already an alarm \"a\".");
     EXPECT_EQ(sentenceFor("snapshot-directory ="),
               "pallax.conf, line 1: snapshot-directory needs a path.");
     for (const char* level : {"8", "-1", "4x", "", "warning", "99999999999"}) {

@@ -3,6 +3,7 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "decoding/DroppedNotices.h"
 #include "monitor/DisplayDriver.h"
+#include "overview/StatusWords.h"
 #include "tests/doubles/FakeBundle.h"
 #include "tests/doubles/ManualClock.h"
 #include "tests/timeline/TimelineFixture.h"
@@ -98,6 +99,65 @@ TEST(StatusWatch, ForgetsEverythingWhenATechnologyBegins) {
     watched.watch.begin("Another");
     watched.play();
     EXPECT_TRUE(watched.overview().status.isEmpty());
+}
+
+/// The value with this name among the levels and the identities of the cells.
+const StatusValue* valueNamed(const Overview& overview, std::string_view name) {
+    for (const StatusCell& cell : overview.status.cells) {
+        for (const auto* values : {&cell.levels, &cell.identity}) {
+            for (const StatusValue& value : *values) {
+                if (value.name == name) {
+                    return &value;
+                }
+            }
+        }
+    }
+    return nullptr;
+}
+
+TEST(StatusWatch, KnowsHowOftenAValueUsuallyComes) {
+    Watched watched("lte");
+    watched.recorded.drive(3, 60s, 20);
+    watched.play();
+    const Overview now = watched.overview();
+    const StatusValue* level = valueNamed(now, "RSRP");
+    ASSERT_NE(level, nullptr);
+    EXPECT_EQ(level->patience, Arrivals::kLeastPatience) << "it comes several times in a second";
+    EXPECT_FALSE(isOverdue(now.status.time, *level));
+    watched.end += 5s;
+    const Overview later = watched.overview();
+    EXPECT_TRUE(isOverdue(later.status.time, *valueNamed(later, "RSRP")));
+    EXPECT_EQ(oldAgeWords(later.status.time, {valueNamed(later, "RSRP")}), "5 s ago");
+}
+
+TEST(StatusWatch, AValueThatCameOnceIsNeverOverdue) {
+    Watched watched("lte");
+    watched.recorded.drive(3, 1s, 20);
+    watched.play();
+    watched.end += 24h;
+    const Overview later = watched.overview();
+    const StatusValue* area = valueNamed(later, "TAC");
+    ASSERT_NE(area, nullptr);
+    EXPECT_FALSE(isOverdue(later.status.time, *area));
+    EXPECT_TRUE(isOld(later.status.time, *area));
+}
+
+TEST(StatusWatch, AnEventCanBeAddedToItsOwn) {
+    Watched watched("lte");
+    watched.recorded.drive(3, 60s, 20);
+    watched.play();
+    for (std::size_t number = 0; number < StatusWatch::kMostEvents; ++number) {
+        watched.watch.add({EventKind::Alarm, watched.end, 0, std::to_string(number), {}});
+    }
+    const auto events = watched.overview().events;
+    ASSERT_EQ(events.size(), StatusWatch::kMostEvents);
+    EXPECT_EQ(events.front().words, "0");
+    EXPECT_EQ(events.back().words, "31");
+    ASSERT_NE(watched.watch.values(), nullptr);
+    watched.watch.begin("Another");
+    watched.watch.add({EventKind::Alarm, watched.end, 0, "lost", {}});
+    EXPECT_TRUE(watched.overview().events.empty());
+    EXPECT_EQ(watched.watch.values(), nullptr);
 }
 
 TEST(StatusWatch, DoesNotTellATimeAcrossAGap) {

@@ -41,21 +41,24 @@ bool isLoading(const ui::BarItems& items) {
 }
 
 int Bars::drawOrigin(int right, int columns) {
-    int room = columns;
-    int left = right;
-    if (_status.timeBar) {
-        const std::string& all = _status.timeBar->words;
-        const std::string words = columnsOf(all) <= columns ? all : all.substr(0, all.find(','));
-        left -= columnsOf(words);
-        room -= columnsOf(words) + kGap;
-        _grid.put(left, kTitleRow, words, {.bold = true});
-        left -= kGap;
+    const int end = right;
+    std::string time = _status.timeBar ? _status.timeBar->words : std::string();
+    if (columnsOf(time) > columns) {
+        time = time.substr(0, time.find(','));
     }
-    const std::string text = originText(_status.origin, _marks, room);
+    for (const std::string& notice : {time, _status.stream, alarmText(_status.alarms, right / 2)}) {
+        if (!notice.empty()) {
+            const int left = std::max(right - columnsOf(notice), kMargin);
+            _grid.put(left, kTitleRow, notice, {.bold = true}, {kMargin, right});
+            right = left - kGap;
+        }
+    }
+    columns -= end - right;
+    const std::string text = originText(_status.origin, _marks, columns);
     if (text.empty()) {
-        return left;
+        return right;
     }
-    left -= columnsOf(text);
+    const int left = right - columnsOf(text);
     _grid.put(left, kTitleRow, text, kSecondary);
     return left - kGap;
 }

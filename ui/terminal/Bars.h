@@ -60,7 +60,9 @@ struct PaneStatus {
     std::string note;      ///< after the status text, or in the rule above if it does not fit
     Origin origin;         ///< in the title
     std::string oldValues; ///< the time of values that are no longer updated
-    std::string zone;      ///< for the time in the status text
+    std::string stream;    ///< why nothing changes; in the title
+    std::vector<std::string> alarms; ///< the names of those that are true; in the title
+    std::string zone;                ///< for the time in the status text
     std::function<void(const KeyEvent&)> press = [](const KeyEvent&) {}; ///< by a click
 };
 
@@ -75,8 +77,9 @@ public:
     Bars(Grid& grid, const Marks& marks, HitMap& hits, const PaneStatus& status)
         : _grid(grid), _marks(marks), _hits(hits), _status(status) {}
 
-    /// The origin of the values and whether time is held, in at most `columns` columns of the title
-    /// row, before column `right`. Returns where the room for the title ends.
+    /// Whether time is held, alarms, the state of the stream, and the origin of the values, in at
+    /// most `columns` columns of the title row, before column `right`. Only the origin leaves the
+    /// title its room. Returns where the room for the title ends.
     int drawOrigin(int right, int columns);
     /// A rule that ends with the number of rows outside the window; returns the first column of the
     /// number.

@@ -267,6 +267,10 @@ bool CursesTerminal::isHungUp() const {
     return ::poll(&input, 1, 0) > 0 && (input.revents & (POLLHUP | POLLERR | POLLNVAL)) != 0;
 }
 
+void CursesTerminal::ringBell() {
+    ::beep();
+}
+
 void CursesTerminal::copy(std::string_view text) {
     const ByteBuffer bytes(text.begin(), text.end());
     const std::string sequence = "\x1b]52;c;" + base64Text(bytes) + "\a";

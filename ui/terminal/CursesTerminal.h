@@ -53,6 +53,7 @@ public:
     std::optional<KeyEvent> read();
     /// Whether the other end of the terminal has gone.
     bool isHungUp() const;
+    void ringBell();
     /// Puts a text into the clipboard of the user's terminal (OSC 52).
     void copy(std::string_view text);
 

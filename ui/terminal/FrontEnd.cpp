@@ -76,6 +76,8 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .note = _note,
                             .origin = _origin,
                             .oldValues = _oldValues,
+                            .stream = _stream,
+                            .alarms = _alarms,
                             .zone = _surroundings.zone(),
                             .press = [this](const KeyEvent& event) { handle(event); }};
     if (_pages.isOpen()) {
@@ -109,6 +111,16 @@ void FrontEnd::setNote(std::string note) {
 
 void FrontEnd::setOrigin(Origin origin) {
     _origin = std::move(origin);
+    needsDisplay();
+}
+
+void FrontEnd::setStream(std::string state) {
+    _stream = std::move(state);
+    needsDisplay();
+}
+
+void FrontEnd::setAlarms(std::vector<std::string> names) {
+    _alarms = std::move(names);
     needsDisplay();
 }
 

@@ -19,6 +19,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace pallax::terminal {
 
@@ -73,6 +74,10 @@ public:
 
     /// Sets the origin of the values.
     void setOrigin(Origin origin);
+    /// Why nothing changes ("no data for 7 s"); "" if the display is as current as it can be.
+    void setStream(std::string state);
+    /// The names of the alarms that are true.
+    void setAlarms(std::vector<std::string> names);
     /// After a restart of the link: the values are from before `time` ("22:13:30"); if empty, they
     /// are current.
     void setOldValues(std::string time);
@@ -122,6 +127,8 @@ private:
     std::optional<std::string> _message;
     std::string _note;
     Origin _origin;
+    std::string _stream;
+    std::vector<std::string> _alarms;
     std::string _oldValues;
     std::size_t _spinnerTurn = 0;
 };

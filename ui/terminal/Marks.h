@@ -11,6 +11,7 @@ struct Marks {
     std::string_view cursor;     ///< before the current row
     std::string_view disclosure; ///< after a row that opens
     std::string_view changed;    ///< after a value that changed since the last tick
+    std::string_view old;        ///< after a value whose age has no room
     std::string_view more;       ///< where a text continues beyond the edge
     std::string_view up;         ///< before the number of rows above the window
     std::string_view down;       ///< before the number of rows below the window
@@ -33,12 +34,16 @@ struct Marks {
     std::array<std::string_view, 4> spinner;
 };
 
-inline constexpr Marks kUtf8Marks{false, "▌", "›", "*", "…", "↑", "↓", " › ",
-                                  " · ", "▆", "▁", "▕", "▏", "●", "◆", "┴",
-                                  "✓",   "─", "│", "┌", "┐", "└", "┘", {"⠋", "⠹", "⠴", "⠧"}};
+inline constexpr Marks kUtf8Marks{false, "▌", "›", "*",   "o",
+                                  "…",   "↑", "↓", " › ", " · ",
+                                  "▆",   "▁", "▕", "▏",   "●",
+                                  "◆",   "┴", "✓", "─",   "│",
+                                  "┌",   "┐", "└", "┘",   {"⠋", "⠹", "⠴", "⠧"}};
 
-inline constexpr Marks kAsciiMarks{true, ">", ">", "*", "~", "^", "v", " > ",
-                                   ", ", "#", ".", "[", "]", "o", "m", "'",
-                                   "x",  "-", "|", "+", "+", "+", "+", {"|", "/", "-", "\\"}};
+inline constexpr Marks kAsciiMarks{true, ">", ">", "*",   "o",
+                                   "~",  "^", "v", " > ", ", ",
+                                   "#",  ".", "[", "]",   "o",
+                                   "m",  "'", "x", "-",   "|",
+                                   "+",  "+", "+", "+",   {"|", "/", "-", "\\"}};
 
 } // namespace pallax::terminal

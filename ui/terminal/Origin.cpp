@@ -43,6 +43,20 @@ std::string originText(const Origin& origin, const Marks& marks, int columns) {
     return columnsOf(origin.technology) <= columns ? origin.technology : "";
 }
 
+std::string alarmText(const std::vector<std::string>& names, int columns) {
+    std::string text;
+    for (const std::string& name : names) {
+        text += text.empty() ? "! " : ", ";
+        text += name;
+    }
+    if (columnsOf(text) <= columns) {
+        return text;
+    }
+    const std::string count = "! " + std::to_string(names.size());
+    const std::string words = count + (names.size() == 1 ? " alarm" : " alarms");
+    return columnsOf(words) <= columns ? words : count;
+}
+
 std::string oldValuesText(std::string_view time, int columns) {
     const std::string from = "values from before " + std::string(time);
     for (const std::string& text :

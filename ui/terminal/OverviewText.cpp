@@ -131,8 +131,11 @@ std::string Blocks::bar(const StatusValue& level) const {
 
 /// Name, level, quality and bar.
 std::vector<TableText> Blocks::levelCells(std::string name, const StatusValue& level) const {
-    return {
-        {std::move(name)}, {level.text, {}, true}, {std::string(qualityWord(level))}, {bar(level)}};
+    const Style style = isOverdue(_status.time, level) ? kPale : Style();
+    return {{std::move(name)},
+            {level.text, style, true},
+            {std::string(qualityWord(level)), style},
+            {bar(level), style}};
 }
 
 Block Blocks::network() const {

@@ -1,5 +1,6 @@
 #include "ui/terminal/PaneView.h"
 
+#include "text/AgeText.h"
 #include "ui/terminal/MarkedText.h"
 #include "ui/terminal/TerminalToolkit.h"
 #include "ui/terminal/TextWidth.h"
@@ -131,20 +132,38 @@ void PaneView::drawBreadcrumbs(TerminalNavigation& navigation, int right) {
     }
 }
 
-/// Also says that the values are old, if they are.
+/// Also says that the values are old, if they are, or which are gone since the last tick.
 void PaneView::drawUpperRule(TerminalTable& table, Bars& bars, const PaneStatus& status) {
     constexpr int kRow = kRowsAbove - 1;
     const int right = bars.drawRule(kRow, _marks.up, table.rowsAbove(), Key::PageUp);
     if (status.oldValues.empty()) {
-        return;
+        return drawGone(table, kRow, right);
     }
     const std::string text = oldValuesText(status.oldValues, right - kMargin);
     const int end = _grid.put(kMargin, kRow, text + " ", kBold, {kMargin, right});
     _hits.add(kMargin, kRow, end - kMargin, 1, [press = status.press] { press(typed(U'R')); });
 }
 
+void PaneView::drawGone(const TerminalTable& table, int y, int right) {
+    std::string text;
+    for (const std::string& name : table.pane().gone()) {
+        text += text.empty() ? "gone: " : ", ";
+        text += name;
+    }
+    if (text.empty()) {
+        return;
+    }
+    const Span room{kMargin, right - 1};
+    if (_grid.put(kMargin, y, text + " ", {}, room) > room.right) {
+        _grid.put(room.right - 1, y, _marks.more, kDim);
+    }
+}
+
 void PaneView::drawRows(TerminalTable& table) {
     const int end = _grid.rows() - kRowsBelow;
+    if (const std::string why = table.pane().emptyWords(); !why.empty() && end > kRowsAbove) {
+        _grid.put(kMargin, kRowsAbove, why, kDim, {kMargin, _grid.columns() - kMargin});
+    }
     std::size_t shown = table.firstShown();
     for (int y = kRowsAbove; y < end && shown < table.pane().shownRows(); ++y, ++shown) {
         drawRow(table, shown, y);
@@ -181,11 +200,17 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const P
         offset = isSelected ? std::min(table.sidewaysOffset(), std::max(beyond, 0)) : 0;
     }
     int end = 0;
+    int nameEnd = 0;
+    int valueStart = 0;
     for (const ui::Label* label : contents.labels) {
-        const Style style{.bold = label->font.face == ui::FontFace::BoldSystem ||
-                                  (row.hasChanged && label != contents.labels.front()),
-                          .accent = isSelected};
+        const bool isName = label == contents.labels.front();
+        const bool isPale = row.overdue && (row.isBranch || !isName);
+        const bool isBold =
+            label->font.face == ui::FontFace::BoldSystem || (row.hasChanged && !isName);
+        const Style style{.bold = isBold && !isPale, .dim = isPale, .accent = isSelected};
         const int x = columnOf(label->frame.origin.x) - offset;
+        nameEnd = isName ? x + columnsOf(label->text) : nameEnd;
+        valueStart = x;
         (void)putMarked(_grid, {x, y}, label->text, style, {kMargin, width}, table.pane().filter());
         end = std::max(end, x + columnsOf(label->text));
     }
@@ -198,6 +223,21 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const P
         _grid.put(last - 1 - columnsOf(count), y, count, kDim);
     } else if (row.hasChanged) {
         _grid.put(last, y, _marks.changed, kBold);
+    }
+    if (row.overdue) {
+        drawAge(*row.overdue, y, {nameEnd, row.isBranch ? last - 1 - columnsOf(count) : valueStart},
+                row.isBranch ? last - 1 : last);
+    }
+}
+
+/// Between the name and the value or count. Without room, a mark stands in a column beside.
+void PaneView::drawAge(std::chrono::nanoseconds age, int y, Span room, int markColumn) {
+    const std::string text = ageText(age);
+    const int left = room.right - kGap - columnsOf(text);
+    if (left >= room.left + kGap) {
+        _grid.put(left, y, text, kDim);
+    } else {
+        _grid.put(markColumn, y, _marks.old, kDim);
     }
 }
 

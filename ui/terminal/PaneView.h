@@ -4,6 +4,7 @@
 #include "ui/terminal/TerminalNavigation.h"
 #include "ui/terminal/TerminalTable.h"
 
+#include <chrono>
 #include <cstddef>
 #include <string_view>
 
@@ -22,10 +23,12 @@ private:
     void drawTitle(TerminalNavigation& navigation, TerminalTable& table, Bars& bars);
     void drawBreadcrumbs(TerminalNavigation& navigation, int right);
     void drawUpperRule(TerminalTable& table, Bars& bars, const PaneStatus& status);
+    void drawGone(const TerminalTable& table, int y, int right);
     void drawRows(TerminalTable& table);
     void drawRow(TerminalTable& table, std::size_t shown, int y);
     void drawCell(const TerminalTable& table, ui::TableCell& cell, const PaneRow& row, int y,
                   bool isSelected);
+    void drawAge(std::chrono::nanoseconds age, int y, Span room, int markColumn);
 
     Grid& _grid;
     const Marks& _marks;

@@ -276,7 +276,7 @@ TEST_F(FrontEndBrowsingTest, APaneWhosePathVanishesIsLeft) {
     stage.tick(Dictionary{{"Other", Dictionary{}}});
     EXPECT_EQ(stage.screen(20, 5), R"(
  Pallax
- ──────────────────
+ gone: Serving Ce…─
 ▌Other             ›
  ──────────────────
  …11-14 at 22:13:20

@@ -136,7 +136,7 @@ TEST_F(FrontEndFilterTest, NewDataIsFilteredAndTheCursorStaysOnItsRow) {
                                                             {"Average RSRP", "-95.00 dBm"}}}});
     EXPECT_EQ(stage.screen(), R"(
  … › Serving Cell Measurements   3 of 4
- ──────────────────────────────────────
+ gone: E-ARFCN, Physical Cell ID, Mea…─
  RSRP of antenna 0             -90 dBm *
  Measured RSRP              -94.75 dBm
 ▌Average RSRP               -95.00 dBm

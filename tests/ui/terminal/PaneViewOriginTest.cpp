@@ -69,6 +69,68 @@ TEST_F(PaneViewOriginTest, AFiltersCountStandsBehindThem) {
     EXPECT_EQ(stage.line(0), " Pallax                  Zorell_LTE · lte-drive.pcap 1 of 5");
 }
 
+TEST_F(PaneViewOriginTest, TheStateOfTheStreamStandsAtTheEdgeOfTheTitle) {
+    setOrigin();
+    stage.frontEnd.setStream("no data for 7 s");
+    stage.frontEnd.resize(80, 8);
+    EXPECT_EQ(stage.line(0),
+              " Pallax                            Zorell_LTE · lte-drive.pcap  no data for 7 s");
+    EXPECT_EQ(styleAt(64, 0), Style{.bold = true});
+    EXPECT_EQ(styleAt(60, 0), Style{.dim = true});
+    stage.press(Key::Enter);
+    const std::pair<int, const char*> expected[] = {
+        {70, " Pallax › Serving Cell Measurements       Zorell_LTE  no data for 7 s"},
+        {60, " Pallax › Serving Cell Measurements         no data for 7 s"},
+        {40, " … › Serving Cell Meas  no data for 7 s"},
+        {20, " …  no data for 7 s"},
+    };
+    for (const auto& [columns, title] : expected) {
+        stage.frontEnd.resize(columns, 8);
+        EXPECT_EQ(stage.line(0), title) << columns;
+    }
+    stage.type("o");
+    stage.frontEnd.resize(40, 8);
+    EXPECT_EQ(stage.line(0), " Pallax › Overview      no data for 7 s");
+    stage.frontEnd.setStream("");
+    EXPECT_EQ(stage.line(0), " Pallax › Overview  Zorell_LTE · ….pcap");
+}
+
+TEST_F(PaneViewOriginTest, AlarmsStandInTheTitleAsLongAsTheyHold) {
+    setOrigin();
+    stage.frontEnd.setAlarms({"weak signal", "漢字"});
+    const std::pair<int, const char*> expected[] = {
+        {80, " Pallax                        Zorell_LTE · lte-drive.pcap  ! weak signal, 漢字"},
+        {40, " Pallax             ! weak signal, 漢字"},
+        {36, " Pallax      Zorell_LTE  ! 2 alarms"},
+        {20, " Pallax         ! 2"},
+    };
+    stage.frontEnd.resize(80, 8);
+    for (const auto& [columns, title] : expected) {
+        stage.frontEnd.resize(columns, 8);
+        EXPECT_EQ(stage.line(0), title) << columns;
+    }
+    stage.frontEnd.setStream("no data for 7 s");
+    stage.frontEnd.resize(60, 8);
+    EXPECT_EQ(stage.line(0), " Pallax    Zorell_LTE  ! weak signal, 漢字  no data for 7 s");
+    EXPECT_EQ(styleAt(23, 0), Style{.bold = true});
+    stage.type("o");
+    EXPECT_EQ(stage.line(0), " Pallax › Overview     ! weak signal, 漢字  no data for 7 s");
+    stage.frontEnd.setStream("");
+    stage.frontEnd.setAlarms({"weak signal"});
+    stage.frontEnd.resize(30, 8);
+    EXPECT_EQ(stage.line(0), " Pallax › Over  ! weak signal");
+    stage.frontEnd.setAlarms({});
+    EXPECT_EQ(stage.line(0), " Pallax › Overview");
+}
+
+TEST_F(PaneViewOriginTest, AnAlarmTextTakesNoMoreThanItsRoomIfPossible) {
+    EXPECT_EQ(alarmText({}, 80), "");
+    EXPECT_EQ(alarmText({"weak"}, 6), "! weak");
+    EXPECT_EQ(alarmText({"weak signal"}, 9), "! 1 alarm");
+    EXPECT_EQ(alarmText({"weak signal", "x"}, 9), "! 2");
+    EXPECT_EQ(alarmText({"weak signal"}, 0), "! 1");
+}
+
 TEST_F(PaneViewOriginTest, WhatIsNotKnownYetIsNotShown) {
     stage.frontEnd.setOrigin({"", "live modem"});
     stage.frontEnd.resize(40, 8);

@@ -98,6 +98,10 @@ private:
             return _stage.frontEnd.setOrigin({"Zorell_LTE", "漢字\xff.pcap"});
         case 0x9C:
             return _stage.frontEnd.setOldValues(next() % 2 == 0 ? "22:13:30" : "");
+        case 0x9D:
+            return _stage.frontEnd.setStream(next() % 2 == 0 ? "no data for 7 s" : "");
+        case 0x9E:
+            return _stage.frontEnd.setAlarms(std::vector<std::string>(next() % 4, "漢字\x1b"));
         case 0x99:
             return _stage.queue.runReady();
         case 0x9A:

@@ -59,6 +59,7 @@ public:
     doubles::ManualClock clock;
     doubles::SteppedQueue queue;
     PropertyList saveHistory;
+    ReadingAges ages; ///< of the panes that are opened later
 
     /// Shows new data: reloads every pane, or pops to below the first whose path has vanished. A
     /// null display means no connection.
@@ -139,6 +140,7 @@ public:
             saveHistory);
         _stack->presentModal(_saveScreen, true);
     }
+    ReadingAges readingAges() override { return ages; }
     ui::NavigationStack* navigationController() override { return _stack.get(); }
     void navigationControllerWillShow(ui::NavigationStack& /*stack*/, ui::TableScreen& screen,
                                       bool /*animated*/) override {
