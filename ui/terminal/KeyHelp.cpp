@@ -6,25 +6,29 @@ namespace pallax::terminal {
 
 namespace {
 
+constexpr auto kPanes = static_cast<unsigned>(HelpPlace::Panes);
+constexpr auto kPages = static_cast<unsigned>(HelpPlace::Pages);
+constexpr auto kSave = static_cast<unsigned>(HelpPlace::Save);
+
 constexpr auto kKeyHelp = std::to_array<KeyHelp>({
-    {"Up Down  k j", "one row up or down"},
+    {"Up Down  k j", "one row up or down", kPanes | kPages},
     {"PgUp PgDn", "one page up or down"},
-    {"Home End  g G", "first or last row"},
-    {"Enter Right l", "open the row"},
-    {"Right Left  l h", "scroll a long row"},
-    {"Left h Backspace", "back"},
+    {"Home End  g G", "first or last row", kPanes | kPages},
+    {"Enter Right l", "open the row", kPanes},
+    {"Right Left  l h", "scroll a long row", kPanes},
+    {"Left h Backspace", "back", kPanes | kPages},
     {"Esc", "clear the filter, or back"},
-    {"/", "filter rows by name or value"},
-    {"o", "overview of the radio"},
-    {"s", "save a snapshot"},
-    {"y", "copy the value"},
-    {"R", "reconnect, drop old values"},
-    {"Tab", "next field on the save screen"},
+    {"/", "filter rows by name or value", kPanes},
+    {"o", "overview of the radio", kPanes | kPages},
+    {"s", "save a snapshot", kPanes},
+    {"y", "copy the value", kPanes},
+    {"R", "reconnect, drop old values", kPanes | kPages},
+    {"Tab", "next field on the save screen", kSave},
     {"Click, wheel", "open the row; scroll"},
     {"Ctrl-L", "redraw the screen"},
     {"Ctrl-Z", "suspend; fg resumes"},
     {"?", "this help"},
-    {"q", "back; at the first pane, quit"},
+    {"q", "back; at the first pane, quit", kPanes | kPages},
     {"Ctrl-C", "quit"},
 });
 
