@@ -79,7 +79,8 @@ public:
 
     /// Whether time is held, alarms, the state of the stream, and the origin of the values, in at
     /// most `columns` columns of the title row, before column `right`. Only the origin leaves the
-    /// title its room. Returns where the room for the title ends.
+    /// title its room; a click on it opens or closes the overview. Returns where the room for the
+    /// title ends.
     int drawOrigin(int right, int columns);
     /// A rule that ends with the number of rows outside the window; returns the first column of the
     /// number.

@@ -315,7 +315,7 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
     case U'y':
         return copyValue(pane);
     case U'?':
-        _help.open();
+        _help.open(_pages.isOpen() ? HelpPlace::Pages : HelpPlace::Panes);
         return needsDisplay();
     case U'R':
         return _surroundings.startAfresh();

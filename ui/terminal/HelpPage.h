@@ -1,9 +1,12 @@
 #pragma once
 
 #include "ui/terminal/Grid.h"
+#include "ui/terminal/KeyHelp.h"
 #include "ui/terminal/Keys.h"
 #include "ui/terminal/Marks.h"
 #include "ui/terminal/Scrolling.h"
+
+#include <optional>
 
 namespace pallax::terminal {
 
@@ -11,13 +14,16 @@ namespace pallax::terminal {
 class HelpPage {
 public:
     bool isOpen() const { return _isOpen; }
-    void open();
-    /// Scrolls if the page does not fit; any other key closes the page.
+    /// Lists the keys that work in this place.
+    void open(HelpPlace place);
+    /// The key of the page lists all keys. Arrows scroll if the page does not fit; any other key
+    /// closes the page.
     void handle(const KeyEvent& event);
     void draw(Grid& grid, const Marks& marks);
 
 private:
     bool _isOpen = false;
+    std::optional<HelpPlace> _place; ///< nothing: all keys are listed
     Scrolling _scrolling;
 };
 

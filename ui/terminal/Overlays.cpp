@@ -1,6 +1,5 @@
 #include "ui/terminal/Overlays.h"
 
-#include "ui/terminal/KeyHelp.h"
 #include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
@@ -54,14 +53,23 @@ void drawAlert(Grid& grid, const Marks& marks, const ui::Alert& alert) {
     drawButton(grid, box.inside().right, buttonRow, button, true);
 }
 
-std::vector<std::string> helpLines(int columns) {
+std::vector<std::string> helpLines(int columns, std::optional<HelpPlace> place) {
+    std::vector<KeyHelp> shown;
+    for (KeyHelp help : keyHelp()) {
+        if (place && help.keys == "?") {
+            help.meaning = "all keys";
+        }
+        if (!place || help.worksIn(*place)) {
+            shown.push_back(help);
+        }
+    }
     int wanted = 0;
-    for (const KeyHelp& help : keyHelp()) {
+    for (const KeyHelp& help : shown) {
         wanted = std::max(wanted, kKeyColumns + columnsOf(help.meaning));
     }
     const bool isNarrow = wanted + kFrameColumns > columns;
     std::vector<std::string> lines;
-    for (const KeyHelp& help : keyHelp()) {
+    for (const KeyHelp& help : shown) {
         std::string line(help.keys);
         if (isNarrow) {
             lines.push_back(std::move(line));
@@ -76,8 +84,8 @@ std::vector<std::string> helpLines(int columns) {
     return lines;
 }
 
-int drawHelp(Grid& grid, const Marks& marks, int first) {
-    const std::vector<std::string> lines = helpLines(grid.columns());
+int drawHelp(Grid& grid, const Marks& marks, int first, std::optional<HelpPlace> place) {
+    const std::vector<std::string> lines = helpLines(grid.columns(), place);
     int columns = 0;
     for (const std::string& line : lines) {
         columns = std::max(columns, columnsOf(line));

@@ -49,11 +49,10 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
               │ s                 save a snapshot               │
               │ y                 copy the value                │
               │ R                 reconnect, drop old values    │
-              │ Tab               next field on the save screen │
               │ Click, wheel      open the row; scroll          │
               │ Ctrl-L            redraw the screen             │
               │ Ctrl-Z            suspend; fg resumes           │
-              │ ?                 this help                     │
+              │ ?                 all keys                      │
               │ q                 back; at the first pane, quit │
               │ Ctrl-C            quit                          │
               └─────────────────────────────────────────────────┘
@@ -82,6 +81,40 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
 │  down            │
 └──────────────────┘
 )");
+}
+
+TEST_F(FrontEndHelpTest, TheSameKeyAgainListsAllKeys) {
+    stage.type("?");
+    EXPECT_EQ(stage.screen(80, 24).find("Tab"), std::string::npos);
+    stage.type("?");
+    const std::string all = stage.screen();
+    EXPECT_NE(all.find("Tab               next field on the save screen"), std::string::npos);
+    EXPECT_NE(all.find("?                 this help"), std::string::npos);
+    stage.type("?");
+    EXPECT_FALSE(isOpen());
+}
+
+TEST_F(FrontEndHelpTest, OverTheOverviewOnlyItsKeysAreListed) {
+    stage.type("o?");
+    const std::string screen = stage.screen(80, 24);
+    EXPECT_NE(screen.find("o                 overview of the radio"), std::string::npos);
+    for (const char* other :
+         {"filter rows", "save a snapshot", "copy the value", "open the row  "}) {
+        EXPECT_EQ(screen.find(other), std::string::npos) << other;
+    }
+}
+
+TEST_F(FrontEndHelpTest, OnTheSaveScreensButtonsOnlyItsKeysAreListed) {
+    stage.saveHistory = snapshotItems();
+    stage.type("s");
+    stage.press(Key::Tab); // leaves the field, in which it is typed
+    stage.type("?");
+    const std::string screen = stage.screen(80, 24);
+    EXPECT_NE(screen.find("Tab               next field on the save screen"), std::string::npos);
+    EXPECT_EQ(screen.find("filter rows"), std::string::npos);
+    stage.press(Key::Escape);
+    EXPECT_FALSE(isOpen());
+    EXPECT_NE(stage.saveScreen(), nullptr);
 }
 
 TEST_F(FrontEndHelpTest, TheArrowsScrollItWhereItDoesNotFit) {
@@ -170,7 +203,7 @@ TEST_F(FrontEndHelpTest, AnyOtherKeyClosesItAndDoesNothingElse) {
     stage.type("?");
     stage.press(Key::Escape);
     EXPECT_FALSE(isOpen());
-    stage.type("??");
+    stage.type("???");
     EXPECT_FALSE(isOpen());
     stage.type("?");
     stage.click(3, 3);
