@@ -1,10 +1,14 @@
 #include "browsing/ScreenBrowser.h"
 
 #include "browsing/LinkNotes.h"
+#include "host/BoundedJournal.h"
 #include "host/KnowledgeFiles.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
 #include "platform/ZoneText.h"
+#include "query/Functions.h"
+#include "querying/QueryHistory.h"
+#include "timeline/Timeline.h"
 
 #include <chrono>
 #include <csignal>
@@ -45,6 +49,7 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
             .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); },
             .overview = [this] { return overview(); },
             .entryPart = [this](const auto& path) { return entryPart(path); },
+            .queries = querySeams(),
             .ahead = [this] { return _link.clock().zone(_link.clock().now()).offset; }};
 }
 
@@ -87,7 +92,27 @@ EntryPart ScreenBrowser::entryPart(const std::string& path) const {
     return _watch.identifies(path) ? EntryPart::Identity : EntryPart::None;
 }
 
-Overview ScreenBrowser::overview() {
+terminal::QuerySeams ScreenBrowser::querySeams() {
+    return {.earlier = [] { return QueryHistory(BoundedJournal::stateFolder()).load(); },
+            .remember =
+                [](const std::string& query) {
+                    (void)QueryHistory(BoundedJournal::stateFolder()).add(query);
+                },
+            .addFunctions =
+                [this](Database& database, Timeline& timeline) {
+                    pallax::addFunctions(database,
+                                         {[this] { return &names(); },
+                                          [](std::string_view name) {
+                                              auto profile = loadProfile(name, profileFolder());
+                                              return profile
+                                                         ? std::optional(std::move(profile).value())
+                                                         : std::nullopt;
+                                          }},
+                                         &timeline.fields());
+                }};
+}
+
+const NetworkNames& ScreenBrowser::names() {
     if (!_names) {
         InstalledNames installed = readInstalledNames(dataFolders());
         for (const std::string& complaint : installed.complaints) {
@@ -96,8 +121,12 @@ Overview ScreenBrowser::overview() {
         }
         _names = std::move(installed.names);
     }
+    return *_names;
+}
+
+Overview ScreenBrowser::overview() {
     const Time now = _link.clock().now();
-    Overview overview = _watch.overview(now, *_names, *builtInProfile(kDefaultProfile));
+    Overview overview = _watch.overview(now, names(), *builtInProfile(kDefaultProfile));
     overview.ahead = _link.clock().zone(now).offset;
     return overview;
 }

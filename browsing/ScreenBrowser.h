@@ -40,6 +40,8 @@ private:
     void display();
     void keepTurning();
     void adoptSize();
+    terminal::QuerySeams querySeams();
+    const NetworkNames& names();
     Overview overview();
     EntryPart entryPart(const std::string& path) const;
 

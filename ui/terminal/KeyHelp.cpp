@@ -18,7 +18,7 @@ constexpr auto kKeyHelp = std::to_array<KeyHelp>({
     {"t", "a list as a table or as rows"},
     {"< > r  x X", "sort a table; hide columns"},
     {"o", "overview of the radio"},
-    {"e", "events, and go to one"},
+    {"e ;", "events; ask in SQL"},
     {"s", "save a snapshot"},
     {"y", "copy the value"},
     {"R", "reconnect, drop old values"},

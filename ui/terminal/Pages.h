@@ -2,13 +2,14 @@
 
 #include "ui/terminal/EventsPage.h"
 #include "ui/terminal/OverviewPage.h"
+#include "ui/terminal/QueryPage.h"
 
 #include <variant>
 #include <vector>
 
 namespace pallax::terminal {
 
-using Page = std::variant<OverviewPage, EventsPage>;
+using Page = std::variant<OverviewPage, EventsPage, QueryPage>;
 
 /// The pages over the panes, the last one on top. They are not on the navigation stack, whose panes
 /// are updated meanwhile.

@@ -34,7 +34,7 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
               │ t                 a list as a table or as rows  │
               │ < > r  x X        sort a table; hide columns    │
               │ o                 overview of the radio         │
-              │ e                 events, and go to one         │
+              │ e ;               events; ask in SQL            │
               │ s                 save a snapshot               │
               │ y                 copy the value                │
               │ R                 reconnect, drop old values    │
@@ -203,7 +203,7 @@ TEST_F(FrontEndHelpTest, EveryKeyIsNamed) {
          {"Up",        "Down", "PgUp", "PgDn", "Home", "End", "Enter",  "Right",  "Left",
           "Backspace", "Esc",  "h",    "j",    "k",    "l",   "g",      "G",      "/",
           "o",         "s",    "y",    "R",    "?",    "q",   "Ctrl-L", "Ctrl-Z", "Tab",
-          "e",         "t",    "<",    ">",    "r",    "x",   "X"}) {
+          "e",         ";",    "t",    "<",    ">",    "r",   "x",      "X"}) {
         EXPECT_NE(std::find(names.begin(), names.end(), key), names.end()) << key;
     }
 }
