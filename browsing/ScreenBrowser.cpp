@@ -92,11 +92,19 @@ EntryPart ScreenBrowser::entryPart(const std::string& path) const {
     return _watch.identifies(path) ? EntryPart::Identity : EntryPart::None;
 }
 
+/// The history is that of the shell of `pallax sql`, where a query ends in ";" and other lines are
+/// commands, which begin with ".".
 terminal::QuerySeams ScreenBrowser::querySeams() {
-    return {.earlier = [] { return QueryHistory(BoundedJournal::stateFolder()).load(); },
+    return {.earlier =
+                [] {
+                    auto lines = QueryHistory(BoundedJournal::stateFolder()).load();
+                    std::erase_if(lines, [](const auto& line) { return line.starts_with('.'); });
+                    return lines;
+                },
             .remember =
                 [](const std::string& query) {
-                    (void)QueryHistory(BoundedJournal::stateFolder()).add(query);
+                    (void)QueryHistory(BoundedJournal::stateFolder())
+                        .add(query.ends_with(';') ? query : query + ';');
                 },
             .addFunctions =
                 [this](Database& database, Timeline& timeline) {

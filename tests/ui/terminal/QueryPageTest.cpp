@@ -107,6 +107,11 @@ TEST_F(QueryPageTest, AMistakeIsASentenceAndTheLineStays) {
     EXPECT_FALSE(draw().cursor().has_value());
 }
 
+TEST_F(QueryPageTest, ASemicolonAtTheEndMayBeThere) {
+    ask("select 1 as one;");
+    EXPECT_TRUE(shows(" one\n"));
+}
+
 TEST_F(QueryPageTest, AnAnswerWithoutRowsSaysSo) {
     ask("select 1 where 0");
     EXPECT_TRUE(shows("There are no such rows."));
