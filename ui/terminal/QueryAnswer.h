@@ -17,7 +17,7 @@ namespace pallax::terminal {
 
 /// The answer to a query, as a table.
 struct QueryAnswer {
-    /// More rows would take long to lay out, and nobody reads them.
+    /// All rows are laid out at once, which takes longer for more.
     static constexpr std::size_t kMostRows = 10000;
 
     TableContent table;
