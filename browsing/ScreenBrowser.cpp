@@ -1,13 +1,15 @@
 #include "browsing/ScreenBrowser.h"
 
 #include "browsing/LinkNotes.h"
-#include "decoding/InstalledKnowledge.h"
+#include "host/BoundedJournal.h"
 #include "host/KnowledgeFiles.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
 #include "link/StreamState.h"
 #include "platform/ZoneText.h"
+#include "querying/QueryHistory.h"
 #include "text/Format.h"
+#include "timeline/Timeline.h"
 
 #include <chrono>
 #include <csignal>
@@ -18,7 +20,7 @@ namespace pallax {
 namespace {
 
 constexpr std::chrono::milliseconds kTurnInterval{150};
-constexpr std::chrono::milliseconds kSilentSearch{100};
+constexpr std::chrono::milliseconds kSilentWork{100};
 
 } // namespace
 
@@ -38,7 +40,7 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                      },
                  .replaced = [this] { _travel.reset(); }}),
       _travel(travelSurroundings()),
-      _alarms({settings.alarms, installedKnowledge(),
+      _alarms({settings.alarms, knowledge(),
                [this](const auto& text) {
                    _frontEnd.toolkit().showAlert({"Alarms that are left out", text, "Close"});
                }}),
@@ -71,6 +73,8 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
                     }
                     needsDisplay();
                 },
+            .mayGoOn = [this] { return mayGoOn("Working. Esc stops."); },
+            .queries = querySeams(),
             .ahead = [this] { return _link.clock().zone(_link.clock().now()).offset; },
             .travel = &_travel};
 }
@@ -81,21 +85,28 @@ Travel::Surroundings ScreenBrowser::travelSurroundings() {
             .now = [this] { return _link.clock().now(); },
             .steadyNow = std::chrono::steady_clock::now,
             .zone = [this](Time time) { return _link.clock().zone(time).offset; },
-            .knowledge = installedKnowledge(),
-            .progress = [this](double share) { return searchOn(share); }};
+            .knowledge = knowledge(),
+            .progress =
+                [this](double share) {
+                    return mayGoOn(formatText("Searching: %d %%. Esc stops.",
+                                              {static_cast<int>(share * 100)}));
+                }};
 }
 
-/// Draws how far a long search is, and looks for the key that stops it.
-bool ScreenBrowser::searchOn(double share) {
+/// Tells of work that takes long, and looks for the key that stops it.
+bool ScreenBrowser::mayGoOn(const std::string& words) {
     const auto now = std::chrono::steady_clock::now();
-    if (!_searchBegan) {
-        _searchBegan = now;
+    if (!_workBegan) {
+        _workBegan = now;
     }
-    if (now - *_searchBegan < kSilentSearch) {
+    if (now - *_workBegan < kSilentWork) {
         return true;
     }
-    _frontEnd.setMessage(
-        formatText("Searching: %d %%. Esc stops.", {static_cast<int>(share * 100)}));
+    if (now - _lookedForKey < kSilentWork) {
+        return true;
+    }
+    _lookedForKey = now;
+    _frontEnd.setMessage(words);
     _terminal.show(_frontEnd.draw());
     while (const auto key = _terminal.read()) {
         if (key->key == terminal::Key::Escape) {
@@ -174,7 +185,36 @@ void ScreenBrowser::tick() {
     _frontEnd.setAlarms(_alarms.holding());
 }
 
-Overview ScreenBrowser::overview() {
+/// The history is that of the shell of `pallax sql`, where a query ends in ";" and other lines are
+/// commands, which begin with ".".
+terminal::QuerySeams ScreenBrowser::querySeams() {
+    return {.earlier =
+                [] {
+                    auto lines = QueryHistory(BoundedJournal::stateFolder()).load();
+                    std::erase_if(lines, [](const auto& line) { return line.starts_with('.'); });
+                    return lines;
+                },
+            .remember =
+                [](const std::string& query) {
+                    (void)QueryHistory(BoundedJournal::stateFolder())
+                        .add(query.ends_with(';') ? query : query + ';');
+                },
+            .addFunctions =
+                [this](Database& database, Timeline& timeline) {
+                    pallax::addFunctions(database, knowledge(), &timeline.fields());
+                }};
+}
+
+/// As `installedKnowledge`, but complaints go to the screen.
+QueryKnowledge ScreenBrowser::knowledge() {
+    return {[this] { return &names(); },
+            [](std::string_view name) {
+                auto profile = loadProfile(name, profileFolder());
+                return profile ? std::optional(std::move(profile).value()) : std::nullopt;
+            }};
+}
+
+const NetworkNames& ScreenBrowser::names() {
     if (!_names) {
         InstalledNames installed = readInstalledNames(dataFolders());
         for (const std::string& complaint : installed.complaints) {
@@ -183,10 +223,14 @@ Overview ScreenBrowser::overview() {
         }
         _names = std::move(installed.names);
     }
+    return *_names;
+}
+
+Overview ScreenBrowser::overview() {
     const QualityProfile profile = *builtInProfile(kDefaultProfile);
     const Time now = _link.clock().now();
-    Overview overview = _travel.isAway() ? overviewAt(_travel.moment(), *_names, profile)
-                                         : _watch.overview(now, *_names, profile);
+    Overview overview = _travel.isAway() ? overviewAt(_travel.moment(), names(), profile)
+                                         : _watch.overview(now, names(), profile);
     overview.ahead = _link.clock().zone(now).offset;
     return overview;
 }
@@ -222,7 +266,7 @@ void ScreenBrowser::waitForKey() {
 /// One key at a time: what it posts to the queue comes before the next one.
 void ScreenBrowser::readKey() {
     if (const auto key = _terminal.read()) {
-        _searchBegan.reset();
+        _workBegan.reset();
         _frontEnd.handle(*key);
         _link.queue().async([this] { readKey(); });
     } else if (_terminal.isHungUp()) {

@@ -39,7 +39,7 @@ private:
     BrowsingSession::Surroundings sessionSurroundings(const Source& source,
                                                       const Settings& settings);
     Travel::Surroundings travelSurroundings();
-    bool searchOn(double share);
+    bool mayGoOn(const std::string& words);
     terminal::FrontEnd::Surroundings frontEndSurroundings();
     void waitForKey();
     void readKey();
@@ -49,6 +49,9 @@ private:
     void display();
     void keepTurning();
     void adoptSize();
+    terminal::QuerySeams querySeams();
+    const NetworkNames& names();
+    QueryKnowledge knowledge();
     Overview overview();
     EntryPart entryPart(const std::string& path) const;
 
@@ -59,7 +62,8 @@ private:
     StatusWatch _watch;
     ViewedTimeline _timeline;
     Travel _travel;
-    std::optional<std::chrono::steady_clock::time_point> _searchBegan; ///< while one goes on
+    std::optional<std::chrono::steady_clock::time_point> _workBegan; ///< since the latest key
+    std::chrono::steady_clock::time_point _lookedForKey;
     AlarmWatch _alarms;
     std::uint64_t _ticks = 0;
     std::optional<NetworkNames> _names; ///< read when the overview is drawn for the first time

@@ -225,15 +225,19 @@ std::optional<std::string> TableModel::copied() const {
     if (!row) {
         return std::nullopt;
     }
+    const std::vector<TableColumn>& columns = _content.columns;
+    const bool hasIdentity = !columns.empty() && columns.front().isIdentity;
     std::string text;
-    for (std::size_t column = 0; column < _content.columns.size(); ++column) {
+    bool hasValue = false;
+    for (std::size_t column = 0; column < columns.size(); ++column) {
         const TableCell& cell = _content.rows[*row].cells[column];
-        const bool isCopied = _chosen ? column == *_chosen : _content.columns[column].isIdentity;
-        if (isCopied && !cell.text.empty()) {
-            text.append(text.empty() ? "" : " ").append(withUnit(cell, _content.columns[column]));
+        if (_chosen ? column == *_chosen : columns[column].isIdentity || !hasIdentity) {
+            const char* const between = hasIdentity ? " " : "\t";
+            text.append(text.empty() ? "" : between).append(withUnit(cell, columns[column]));
+            hasValue = hasValue || !cell.text.empty();
         }
     }
-    return text.empty() ? std::nullopt : std::optional(text);
+    return hasValue ? std::optional(text) : std::nullopt;
 }
 
 } // namespace pallax

@@ -62,8 +62,8 @@ public:
     void hideChosen();
     void showAllColumns();
 
-    /// The cursor's value in the chosen column with its unit, or else its identity. Nothing without
-    /// a row or a value.
+    /// The cursor's value in the chosen column with its unit, or else its identity, or without one
+    /// the whole row with tabs between its values. Nothing without a row or a value.
     std::optional<std::string> copied() const;
 
 private:

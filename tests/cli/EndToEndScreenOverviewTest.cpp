@@ -77,5 +77,28 @@ TEST_F(EndToEndScreen, ListsAreTablesIfTheSettingsSaySo) {
     EXPECT_EQ(terminal.wait(), 0);
 }
 
+TEST_F(EndToEndScreen, QueriesShareTheirHistoryWithTheShellOfSql) {
+    std::filesystem::create_directories(world.path("state/pallax"));
+    const std::string history = world.path("state/pallax/sql-history");
+    std::ofstream(history) << "select 7 from packet;\n.tables\n";
+    PallaxTerminal terminal(world, {lteDrive(), "--speed", "max"}, {});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    terminal.type(";");
+    ASSERT_TRUE(terminal.shows("Pallax › Query"));
+    terminal.type("\x1b[A");
+    EXPECT_TRUE(terminal.shows(" ; select 7 from packet;")) << "and no command of the shell";
+    terminal.type("\x15select 8\r");
+    EXPECT_TRUE(doubles::eventually([&history] {
+        return contentOf(history) == "select 7 from packet;\n.tables\nselect 8;\n";
+    })) << contentOf(history);
+    terminal.type(kEscape);
+    terminal.type(kEscape);
+    EXPECT_TRUE(terminal.shows("▌Serving Cell Info"));
+    terminal.type("e");
+    EXPECT_TRUE(terminal.shows("Pallax › Events"));
+    terminal.type("q");
+    EXPECT_EQ(terminal.wait(), 0);
+}
+
 } // namespace
 } // namespace pallax

@@ -99,6 +99,13 @@ void FrontEnd::openEvents() {
     needsDisplay();
 }
 
+void FrontEnd::openQuery() {
+    _pages.open(
+        QueryPage({_surroundings.moment, _surroundings.goTo, _surroundings.mayGoOn,
+                   _surroundings.queries, [this](const std::string& text) { copy(text); }}));
+    needsDisplay();
+}
+
 void FrontEnd::setMessage(std::string message) {
     _message = std::move(message);
     needsDisplay();
@@ -310,6 +317,8 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return openOverview();
     case U'e':
         return openEvents();
+    case U';':
+        return openQuery();
     case U's':
         return save();
     case U'y':

@@ -45,6 +45,9 @@ public:
         std::function<Moment()> moment = [] { return Moment(); };
         /// Shows the instant of a packet.
         std::function<void(std::uint64_t packet)> goTo = [](std::uint64_t /*packet*/) {};
+        /// Asked often during long work, such as a query; false stops it.
+        std::function<bool()> mayGoOn = [] { return true; };
+        QuerySeams queries = {};
         /// Local time minus UTC, for times of day.
         std::function<std::chrono::seconds()> ahead = [] { return std::chrono::seconds(0); };
         /// Goes back in time; null if there is only the present. Must outlive the front end.
@@ -63,6 +66,7 @@ public:
     /// Shows the overview over the panes, as its key does.
     void openOverview();
     void openEvents();
+    void openQuery();
 
     /// Whether lists open as tables, until the user chooses otherwise.
     void showListsAsTables(bool asTables) { _toolkit.lists().asTables = asTables; }

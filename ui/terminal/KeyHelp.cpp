@@ -22,7 +22,7 @@ constexpr auto kKeyHelp = std::to_array<KeyHelp>({
     {"t", "a list as a table or as rows", kPanes},
     {"< > r  x X", "sort a table; hide columns", kPanes},
     {"o", "overview of the radio", kPanes | kPages},
-    {"e", "events, and go to one", kPanes | kPages},
+    {"e ;", "events; ask in SQL", kPanes | kPages},
     {"Space", "hold time; play on from there", kPanes | kPages},
     {", .", "one tick back or forward", kPanes | kPages},
     {"[ ]", "to the event before or after", kPanes | kPages},

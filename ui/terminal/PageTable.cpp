@@ -7,6 +7,21 @@
 
 namespace pallax::terminal {
 
+namespace {
+
+/// Draws a text in the rows of the content, as much of it as fits.
+void drawText(Grid& grid, std::string_view text, int rows) {
+    const Span span{kMargin, grid.columns() - kMargin};
+    int y = kRowsAbove;
+    for (const std::string& line : wrappedText(text, span.right - span.left)) {
+        if (y < kRowsAbove + rows) {
+            grid.put(kMargin, y++, line, {}, span);
+        }
+    }
+}
+
+} // namespace
+
 PageAnswer PageTable::handle(const KeyEvent& event) {
     if (_filterEditor) {
         return handleFilter(event);
@@ -60,7 +75,7 @@ void PageTable::draw(const PageScreen& screen, const PageSurroundings& around, c
     const int rows = std::max(grid.rows() - kRowsAbove - kRowsBelow, 0);
     _table.setArea(grid.columns(), rows);
     if (model().content().rows.empty()) {
-        grid.put(kMargin, kRowsAbove, words.empty, {}, {kMargin, grid.columns() - kMargin});
+        drawText(grid, words.empty, rows);
     } else {
         _table.draw(
             grid, screen.marks, screen.hits, kRowsAbove,
@@ -97,6 +112,10 @@ void PageTable::drawLastRow(const PageScreen& screen, const PageSurroundings& ar
     if (_filterEditor) {
         return drawPrompt(screen.grid, bars, "/", *_filterEditor,
                           {"Esc clear filter", {.key = Key::Escape}});
+    }
+    if (words.prompt.line != nullptr) {
+        return drawPrompt(screen.grid, bars, words.prompt.mark, *words.prompt.line,
+                          words.prompt.hint);
     }
     PaneStatus status = around.status;
     if (!words.message.empty() && !status.message) {

@@ -17,12 +17,20 @@ class PageTable {
 public:
     using Copy = std::function<void(const std::string&)>;
 
+    /// A line that is being typed in the last row.
+    struct Prompt {
+        std::string_view mark;
+        const LineEditor* line = nullptr; ///< null: none
+        Hint hint = {};
+    };
+
     /// The words around a table.
     struct Words {
         std::string_view title;        ///< of the page
-        std::string_view empty;        ///< instead of a table without columns or rows
+        std::string_view empty;        ///< instead of a table without rows
         std::vector<Hint> hints = {};  ///< before those of every table
         std::string_view message = {}; ///< instead of the status, if not empty
+        Prompt prompt = {};
     };
 
     /// Copies values to the clipboard by this function.

@@ -3,6 +3,7 @@
 #include "ui/terminal/ChangesPage.h"
 #include "ui/terminal/EventsPage.h"
 #include "ui/terminal/OverviewPage.h"
+#include "ui/terminal/QueryPage.h"
 
 #include <utility>
 #include <variant>
@@ -10,7 +11,7 @@
 
 namespace pallax::terminal {
 
-using Page = std::variant<OverviewPage, ChangesPage, EventsPage>;
+using Page = std::variant<OverviewPage, ChangesPage, EventsPage, QueryPage>;
 
 /// The pages over the panes, the last one on top. They are not on the navigation stack, whose panes
 /// are updated meanwhile.

@@ -24,4 +24,7 @@ std::vector<Cluster> clustersOf(std::string_view text);
 /// The width of the text in columns.
 int columnsOf(std::string_view text);
 
+/// Wraps a text at blanks into lines of at most this width; longer words stay whole.
+std::vector<std::string> wrappedText(std::string_view text, int columns);
+
 } // namespace pallax::terminal

@@ -254,5 +254,14 @@ TEST_F(TableModelTest, ColumnsOfOneNameAreHiddenTogether) {
     EXPECT_EQ(model.columns().size(), 2U);
 }
 
+TEST_F(TableModelTest, WithoutAnIdentityTheWholeRowIsCopied) {
+    TableContent content = cells();
+    content.columns[0].isIdentity = false;
+    model.show(content);
+    EXPECT_EQ(model.copied(), "252\t-91 dBm\tcamped");
+    model.show({{{"A"}}, {{"", {text("")}}}});
+    EXPECT_EQ(model.copied(), std::nullopt);
+}
+
 } // namespace
 } // namespace pallax

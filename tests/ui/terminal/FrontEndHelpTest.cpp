@@ -36,7 +36,7 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
               │ t                 a list as a table or as rows  │
               │ < > r  x X        sort a table; hide columns    │
               │ o                 overview of the radio         │
-              │ e                 events, and go to one         │
+              │ e ;               events; ask in SQL            │
               │ Space             hold time; play on from there │
               │ , .               one tick back or forward      │
               │ [ ]               to the event before or after  │
@@ -250,7 +250,7 @@ TEST_F(FrontEndHelpTest, EveryKeyIsNamed) {
          {"Up",        "Down", "PgUp", "PgDn", "Home", "End", "Enter",  "Right",  "Left",
           "Backspace", "Esc",  "h",    "j",    "k",    "l",   "g",      "G",      "/",
           "o",         "s",    "y",    "R",    "?",    "q",   "Ctrl-L", "Ctrl-Z", "Tab",
-          "e",         "t",    "<",    ">",    "r",    "x",   "X"}) {
+          "e",         ";",    "t",    "<",    ">",    "r",   "x",      "X"}) {
         EXPECT_NE(std::find(names.begin(), names.end(), key), names.end()) << key;
     }
 }

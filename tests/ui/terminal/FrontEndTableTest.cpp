@@ -267,7 +267,7 @@ TEST_F(FrontEndTableTest, TheCountSaysWhatTheRowsAre) {
     stage.tick(displayOf(threeCells()));
     EXPECT_EQ(stage.line(0), " Pallax › Cells                                   3 entries");
     stage.type("y");
-    EXPECT_EQ(stage.copied.back(), "0") << "without an identity, the entry's name";
+    EXPECT_EQ(stage.copied.back(), "-91.50 dBm\t252\t2") << "without an identity, the row";
 }
 
 TEST_F(FrontEndTableTest, RowsOutsideTheWindowAreCountedInTheRules) {

@@ -110,7 +110,7 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ t                 a list as a table or as rows  │
 │ < > r  x X        sort a table; hide columns    │
 │ o                 overview of the radio         │
-│ e                 events, and go to one         │
+│ e ;               events; ask in SQL            │
 │ Space             hold time; play on from there │
 │ , .               one tick back or forward      │
 │ [ ]               to the event before or after  │

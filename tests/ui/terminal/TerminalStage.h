@@ -23,14 +23,22 @@ namespace pallax::terminal {
 class TerminalStage final : public PaneApplication, public ui::NavigationDelegate {
 public:
     explicit TerminalStage(const Marks& marks = kUtf8Marks, Travel* travel = nullptr)
-        : frontEnd(
-              {[this] { ++displays; }, [this] { ++quits; },
-               [this](const std::string& text) { copied.push_back(text); }, [this] { ++repaints; },
-               [this] { ++startsAfresh; }, [this] { return zone; }, [this] { return overview; },
-               [this](const std::string& path) { return entryPart(path); },
-               [this] { return moment; }, [this](std::uint64_t packet) { went.push_back(packet); },
-               [this] { return ahead; }, travel},
-              marks),
+        : frontEnd({[this] { ++displays; },
+                    [this] { ++quits; },
+                    [this](const std::string& text) { copied.push_back(text); },
+                    [this] { ++repaints; },
+                    [this] { ++startsAfresh; },
+                    [this] { return zone; },
+                    [this] { return overview; },
+                    [this](const std::string& path) { return entryPart(path); },
+                    [this] { return moment; },
+                    [this](std::uint64_t packet) { went.push_back(packet); },
+                    [this] { return mayGoOn(); },
+                    {[this] { return earlier; },
+                     [this](const std::string& query) { remembered.push_back(query); }},
+                    [this] { return ahead; },
+                    travel},
+                   marks),
           _window(frontEnd.toolkit().makeWindow({})) {
         auto root = std::make_shared<PallaxPaneController>(frontEnd.toolkit(), *this, nullptr, "/");
         root->setStatus("Connecting", true);
@@ -52,6 +60,9 @@ public:
     Moment moment;
     std::vector<std::uint64_t> went;
     std::chrono::seconds ahead{0};
+    std::function<bool()> mayGoOn = [] { return true; };
+    std::vector<std::string> earlier; ///< queries
+    std::vector<std::string> remembered;
 
     bool savingAllowed = true;
     std::optional<std::string> status; ///< null: follows the connection

@@ -1,0 +1,40 @@
+#pragma once
+
+#include "app/table/TableContent.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string>
+
+namespace pallax {
+class Database;
+class Timeline;
+} // namespace pallax
+
+namespace pallax::terminal {
+
+/// The answer to a query, as a table.
+struct QueryAnswer {
+    /// All rows are laid out at once, which takes longer for more.
+    static constexpr std::size_t kMostRows = 10000;
+
+    TableContent table;
+    /// The reason if the query could not be run or was stopped; or that there are more rows.
+    std::string sentence;
+    bool hasFailed = false;
+};
+
+/// Runs a query over the tables of a timeline. `mayGoOn` is asked often, and stops it by false;
+/// `addFunctions` adds functions to the database.
+QueryAnswer answerQuery(Timeline& timeline, const std::string& query,
+                        const std::function<bool()>& mayGoOn,
+                        const std::function<void(Database&, Timeline&)>& addFunctions);
+
+/// The packet that a row of an answer tells of: by a column `packet`, or by the time in a column
+/// `time`. Nothing if the row tells of none.
+std::optional<std::uint64_t> packetOf(const TableContent& table, std::size_t row,
+                                      const Timeline& timeline);
+
+} // namespace pallax::terminal
