@@ -55,7 +55,7 @@ private:
         int x;
         int width;
         std::vector<std::string> heading;
-        bool isWhole; ///< or as much of it as can be shown at all
+        bool isWhole; ///< or as much as can be shown at all
     };
     struct Brush;
 

@@ -9,7 +9,7 @@ namespace pallax::terminal {
 
 namespace {
 
-/// Draws a text in the rows of the content, as much of it as fits.
+/// Draws a text in the rows of the content, as much as fits.
 void drawText(Grid& grid, std::string_view text, int rows) {
     const Span span{kMargin, grid.columns() - kMargin};
     int y = kRowsAbove;

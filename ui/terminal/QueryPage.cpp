@@ -14,7 +14,7 @@ constexpr std::string_view kExample =
 constexpr std::string_view kNothingToAsk = "There is nothing to ask yet: no packet has come.";
 constexpr std::string_view kNoInstant = "The row has no packet and no time to go to.";
 constexpr std::string_view kRunning = "The query is running.";
-constexpr std::string_view kNoRows = "There are no such rows.";
+constexpr std::string_view kNoRows = "The query gave no rows.";
 
 } // namespace
 

@@ -246,7 +246,7 @@ TEST_F(FrontEndTableTest, TheFilterLooksIntoEveryCell) {
     stage.type("/-104");
     stage.press(Key::Enter);
     stage.type("t");
-    EXPECT_EQ(stage.pane().shownRows(), 3U) << "rows have no such filter";
+    EXPECT_EQ(stage.pane().shownRows(), 3U) << "rows have a filter of their own";
 }
 
 TEST_F(FrontEndTableTest, YCopiesTheIdentityOrTheChosenValue) {

@@ -114,7 +114,7 @@ TEST_F(QueryPageTest, ASemicolonAtTheEndMayBeThere) {
 
 TEST_F(QueryPageTest, AnAnswerWithoutRowsSaysSo) {
     ask("select 1 where 0");
-    EXPECT_TRUE(shows("There are no such rows."));
+    EXPECT_TRUE(shows("The query gave no rows."));
     stage.type("ry");
     stage.press(Key::Enter);
     EXPECT_TRUE(stage.went.empty());
