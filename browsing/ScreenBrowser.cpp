@@ -42,7 +42,14 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
                 },
             .startAfresh = [this] { _session.startAfresh(); },
             .zone = [this] { return zoneText(_link.clock().zone(_link.clock().now())); },
-            .overview = [this] { return overview(); }};
+            .overview = [this] { return overview(); },
+            .values = [this] { return _watch.values(); },
+            .names = [this]() -> const NetworkNames& { return names(); },
+            .time =
+                [this] {
+                    const Time now = _link.clock().now();
+                    return terminal::DisplayTime{now, _link.clock().zone(now).offset};
+                }};
 }
 
 BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource source,
@@ -77,7 +84,7 @@ BrowsingSession::Surroundings ScreenBrowser::sessionSurroundings(BrowsedSource s
             .startsAfreshByItself = settings.afterReconnect == AfterReconnect::Fresh};
 }
 
-Overview ScreenBrowser::overview() {
+const NetworkNames& ScreenBrowser::names() {
     if (!_names) {
         InstalledNames installed = readInstalledNames(dataFolders());
         for (const std::string& complaint : installed.complaints) {
@@ -86,8 +93,12 @@ Overview ScreenBrowser::overview() {
         }
         _names = std::move(installed.names);
     }
+    return *_names;
+}
+
+Overview ScreenBrowser::overview() {
     const Time now = _link.clock().now();
-    Overview overview = _watch.overview(now, *_names, *builtInProfile(kDefaultProfile));
+    Overview overview = _watch.overview(now, names(), *builtInProfile(kDefaultProfile));
     overview.ahead = _link.clock().zone(now).offset;
     return overview;
 }

@@ -40,6 +40,7 @@ private:
     void display();
     void keepTurning();
     void adoptSize();
+    const NetworkNames& names();
     Overview overview();
 
     bool _isDisplayPosted = false;
@@ -47,7 +48,7 @@ private:
     BrowseLink _link;
     DescriptorWatch _keys;
     StatusWatch _watch;
-    std::optional<NetworkNames> _names; ///< read when the overview is drawn for the first time
+    std::optional<NetworkNames> _names; ///< read when a page asks for the first time
     terminal::FrontEnd _frontEnd;
     HostFileSystem _files;
     FilePreferences _preferences;

@@ -37,6 +37,9 @@ public:
 
     Overview overview(Time time, const NetworkNames& names, const QualityProfile& profile) const;
 
+    /// The current values; null without a technology.
+    const CurrentValues* values() const { return _known ? &_known->values : nullptr; }
+
     void beginPacket(const SamplePacket& packet) override;
     void endPacket() override;
     void beginSection(std::string_view section) override {

@@ -11,15 +11,6 @@ namespace {
 
 constexpr std::chrono::seconds kLeastGap{10}; // many fields are read less often than once a second
 
-/// The stretch that contains a packet.
-const Stretch* stretchWith(const Timeline& timeline, std::uint64_t packet) {
-    const auto& all = timeline.stretches();
-    const auto after = std::upper_bound(
-        all.begin(), all.end(), packet,
-        [](std::uint64_t wanted, const Stretch& stretch) { return wanted < stretch.firstPacket; });
-    return after == all.begin() ? nullptr : &*(after - 1);
-}
-
 Curve decodedCurve(Timeline& timeline, FieldIndex field, EntryId entry, const CurveWindow& window) {
     Curve curve;
     for (const SeriesPoint& point :
@@ -57,6 +48,14 @@ Curve keptCurve(const Timeline& timeline, FieldIndex field, EntryId entry,
 }
 
 } // namespace
+
+const Stretch* stretchWith(const Timeline& timeline, std::uint64_t packet) {
+    const auto& all = timeline.stretches();
+    const auto after = std::upper_bound(
+        all.begin(), all.end(), packet,
+        [](std::uint64_t wanted, const Stretch& stretch) { return wanted < stretch.firstPacket; });
+    return after == all.begin() ? nullptr : &*(after - 1);
+}
 
 std::optional<Time> timeOf(const Timeline& timeline, std::uint64_t instant) {
     const auto packet = timeline.journal().reader(instant)->next();

@@ -34,6 +34,8 @@ struct CurveWindow {
     Time to;
 };
 
+/// The stretch that contains a packet; null if there is none.
+const Stretch* stretchWith(const Timeline& timeline, std::uint64_t packet);
 /// The time of an instant's packet; nothing if the journal does not have it.
 std::optional<Time> timeOf(const Timeline& timeline, std::uint64_t instant);
 

@@ -15,7 +15,8 @@ constexpr int kScrollColumns = 8; // per key, in a row that does not fit
 } // namespace
 
 FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
-    : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }) {}
+    : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }),
+      _shown(_surroundings.valueSource()) {}
 
 /// Click areas may be out of date until the next drawing.
 void FrontEnd::needsDisplay() {
@@ -218,7 +219,7 @@ void FrontEnd::handlePage(const KeyEvent& event) {
     if (character == U'q' && !_toolkit.navigation()->isAtRoot()) {
         _pages.closeTop();
         needsDisplay();
-    } else if (character == U'q' || character == U'?' || character == U'R') {
+    } else if (character == U'q' || character == U'?' || character == U'R' || character == U'V') {
         handlePaneCharacter(character);
     }
 }
@@ -246,8 +247,7 @@ void FrontEnd::handlePane(const KeyEvent& event) {
     }
     switch (event.key) {
     case Key::Enter:
-        openOrScroll(pane, false);
-        return;
+        return openRow();
     case Key::Right:
         openOrScroll(pane, true);
         return;
@@ -287,6 +287,10 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return startFilter(pane);
     case U'o':
         return openOverview();
+    case U'i':
+    case U'v':
+    case U'V':
+        return handleValueKey(character);
     case U's':
         return save();
     case U'y':

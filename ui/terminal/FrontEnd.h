@@ -1,5 +1,6 @@
 #pragma once
 
+#include "ui/terminal/Graph.h"
 #include "ui/terminal/Grid.h"
 #include "ui/terminal/HelpPage.h"
 #include "ui/terminal/HitMap.h"
@@ -9,6 +10,7 @@
 #include "ui/terminal/ModalView.h"
 #include "ui/terminal/Origin.h"
 #include "ui/terminal/Pages.h"
+#include "ui/terminal/ShownValues.h"
 #include "ui/terminal/TerminalToolkit.h"
 
 #include <functional>
@@ -34,6 +36,17 @@ public:
         std::function<std::string()> zone = [] { return std::string(); };
         /// What the overview shows now.
         std::function<Overview()> overview = [] { return Overview(); };
+        /// The shown instant of the timeline, if there is one.
+        std::function<Moment()> moment = [] { return Moment(); };
+        /// The current values while there is no timeline; null if there are none.
+        std::function<const CurrentValues*()> values = [] { return nullptr; };
+        std::function<const NetworkNames&()> names = []() -> const NetworkNames& {
+            static const NetworkNames none;
+            return none;
+        };
+        std::function<DisplayTime()> time = [] { return DisplayTime(); };
+
+        ShownValues::Source valueSource() const;
     };
 
     FrontEnd(Surroundings surroundings, const Marks& marks);
@@ -75,6 +88,11 @@ private:
     void handlePaneCharacter(char32_t character);
     bool moveCursor(TerminalTable& table, const KeyEvent& event);
     void openOrScroll(TerminalTable& table, bool mayScroll);
+    void openRow();
+    std::optional<PaneLeaf> leafAtCursor() const;
+    void openValue(PaneLeaf leaf);
+    void openGraph();
+    void handleValueKey(char32_t character);
     void goBack(TerminalTable& table);
     void escape(TerminalTable& table);
     void save();
@@ -91,6 +109,8 @@ private:
     TerminalToolkit _toolkit;
     ModalFocus _modalFocus = ModalFocus::Save;
     HelpPage _help;
+    ShownValues _shown;
+    Graph _graph;
     Pages _pages;
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
     std::weak_ptr<ui::TableScreen> _filteredPane; ///< the pane of the filter

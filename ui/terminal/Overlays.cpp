@@ -15,25 +15,6 @@ namespace {
 constexpr int kFrameColumns = 4; // frame and blanks
 constexpr int kKeyColumns = 18;  // of the help page
 
-/// Wraps the text at blanks into lines of at most this width; cuts longer words.
-std::vector<std::string> wrapped(std::string_view text, int columns) {
-    std::vector<std::string> lines(1);
-    while (!text.empty()) {
-        const std::size_t end = std::min(text.find(' '), text.size());
-        const std::string_view word = text.substr(0, end);
-        text.remove_prefix(std::min(end + 1, text.size()));
-        std::string& line = lines.back();
-        if (line.empty()) {
-            line = word;
-        } else if (columnsOf(line) + 1 + columnsOf(word) <= columns) {
-            line.append(1, ' ').append(word);
-        } else {
-            lines.emplace_back(word);
-        }
-    }
-    return lines;
-}
-
 } // namespace
 
 void drawAlert(Grid& grid, const Marks& marks, const ui::Alert& alert) {
@@ -42,7 +23,7 @@ void drawAlert(Grid& grid, const Marks& marks, const ui::Alert& alert) {
     const int wanted =
         std::max({columnsOf(alert.title), columnsOf(alert.message) + kAir, columnsOf(button)});
     const int inside = std::min(wanted + kFrameColumns, grid.columns()) - kFrameColumns;
-    const std::vector<std::string> lines = wrapped(alert.message, inside);
+    const std::vector<std::string> lines = wrappedAtBlanks(alert.message, inside);
     const int rows = static_cast<int>(lines.size()) + 1;
     const Box box = centeredBox(grid, wanted + kFrameColumns, rows + Box::kFrame);
     drawBox(grid, marks, box, alert.title);
@@ -65,7 +46,8 @@ std::vector<std::string> helpLines(int columns) {
         std::string line(help.keys);
         if (isNarrow) {
             lines.push_back(std::move(line));
-            for (const std::string& part : wrapped(help.meaning, columns - kFrameColumns - 1)) {
+            for (const std::string& part :
+                 wrappedAtBlanks(help.meaning, columns - kFrameColumns - 1)) {
                 lines.push_back(std::string(1, ' ').append(part));
             }
         } else {

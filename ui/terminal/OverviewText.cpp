@@ -1,6 +1,7 @@
 #include "ui/terminal/OverviewText.h"
 
 #include "overview/StatusWords.h"
+#include "ui/terminal/PageTitle.h"
 #include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
@@ -224,19 +225,13 @@ Block Blocks::contexts() const {
 
 /// The latest first.
 Block Blocks::events() const {
-    constexpr std::string_view kArrow = "→";
     constexpr std::size_t kTimeOfDay = 11; // in "2023-11-14 22:14:06"
     constexpr std::size_t kLeast = 3;
     Block block{"Events", {}, kLeast};
     for (auto event = _overview.events.rbegin(); event != _overview.events.rend(); ++event) {
-        std::string words = event->words;
-        const std::size_t arrow = _marks.asciiOnly ? words.find(kArrow) : std::string::npos;
-        if (arrow != std::string::npos) {
-            words.replace(arrow, kArrow.size(), "->");
-        }
         block.rows.push_back(
             {{localDateText(event->time, _overview.ahead).substr(kTimeOfDay) + "  ", kPale},
-             {std::move(words)}});
+             {eventWords(event->words, _marks)}});
     }
     return block;
 }

@@ -1,13 +1,15 @@
 #pragma once
 
+#include "ui/terminal/GraphPage.h"
 #include "ui/terminal/OverviewPage.h"
+#include "ui/terminal/ValuePage.h"
 
 #include <variant>
 #include <vector>
 
 namespace pallax::terminal {
 
-using Page = std::variant<OverviewPage>;
+using Page = std::variant<OverviewPage, ValuePage, GraphPage>;
 
 /// The pages over the panes, the last one on top. They are not on the navigation stack, whose panes
 /// are updated meanwhile.

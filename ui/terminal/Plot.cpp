@@ -130,15 +130,13 @@ private:
         return _area.y + _curves.rowOf(value) / dotsPerCell(_marks.curves).down;
     }
 
-    /// The lines of events and of the cursor, below the curves.
+    /// The line of the cursor and the marks of events above the time axis, below the curves.
     void drawLines() {
-        for (int y = _area.y; y < _area.y + _rows; ++y) {
-            for (const PlotEvent& event : _plot.events) {
-                _grid.put(columnAt(event.time), y, _marks.event, kPaleAxis);
-            }
-            if (_plot.cursor) {
-                _grid.put(columnAt(*_plot.cursor), y, _marks.vertical, kCursorColumn);
-            }
+        for (const PlotEvent& event : _plot.events) {
+            _grid.put(columnAt(event.time), _area.y + _rows - 1, _marks.event, kPaleAxis);
+        }
+        for (int y = _area.y; _plot.cursor && y < _area.y + _rows; ++y) {
+            _grid.put(columnAt(*_plot.cursor), y, _marks.vertical, kCursorColumn);
         }
     }
 
@@ -196,6 +194,9 @@ private:
         _grid.put(_left - kMarkColumns - columnsOf(_plot.unit), y, _plot.unit, kPaleAxis, room);
         _grid.put(_left - 1, y, _marks.bottomLeft, kPaleAxis);
         _grid.fill({_left, end}, y, _marks.horizontal, kPaleAxis);
+        for (const PlotEvent& event : _plot.events) {
+            _grid.put(columnAt(event.time), y, _marks.event);
+        }
         for (const TimeLabel& label : timeLabels(_plot.from, _plot.to, _plot.ahead, _columns)) {
             const int width = columnsOf(label.text) + 2;
             const int x = columnAt(label.time) - width / 2;
@@ -204,9 +205,6 @@ private:
                 _grid.put(x, y, " ");
                 _grid.put(x + width - 1, y, " ");
             }
-        }
-        for (const PlotEvent& event : _plot.events) {
-            _grid.put(columnAt(event.time), y, _marks.event);
         }
     }
 

@@ -18,7 +18,7 @@ struct PlotCurve {
     Curve curve;
 };
 
-/// Something that happened, as a vertical line.
+/// Something that happened, as a mark above the time axis.
 struct PlotEvent {
     Time time;
     std::string words;

@@ -93,4 +93,22 @@ int columnsOf(std::string_view text) {
     return columns;
 }
 
+std::vector<std::string> wrappedAtBlanks(std::string_view text, int columns) {
+    std::vector<std::string> lines(1);
+    while (!text.empty()) {
+        const std::size_t end = std::min(text.find(' '), text.size());
+        const std::string_view word = text.substr(0, end);
+        text.remove_prefix(std::min(end + 1, text.size()));
+        std::string& line = lines.back();
+        if (line.empty()) {
+            line = word;
+        } else if (columnsOf(line) + 1 + columnsOf(word) <= columns) {
+            line.append(1, ' ').append(word);
+        } else {
+            lines.emplace_back(word);
+        }
+    }
+    return lines;
+}
+
 } // namespace pallax::terminal

@@ -24,4 +24,7 @@ std::vector<Cluster> clustersOf(std::string_view text);
 /// The width of the text in columns.
 int columnsOf(std::string_view text);
 
+/// Wraps the text at blanks into lines of at most this width; a longer word has a line of its own.
+std::vector<std::string> wrappedAtBlanks(std::string_view text, int columns);
+
 } // namespace pallax::terminal

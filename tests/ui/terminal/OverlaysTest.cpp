@@ -108,6 +108,9 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ Esc               clear the filter, or back     │
 │ /                 filter rows by name or value  │
 │ o                 overview of the radio         │
+│ i Enter           all about the value           │
+│ v V               put it in the graph; open it  │
+│ + -  Left Right   zoom and read a curve         │
 │ s                 save a snapshot               │
 │ y                 copy the value                │
 │ R                 reconnect, drop old values    │

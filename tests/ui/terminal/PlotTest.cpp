@@ -118,28 +118,28 @@ TEST(Plot, SeveralCurvesHaveTheirMarksAtTheirEnds) {
 )");
 }
 
-TEST(Plot, EventsAndTheCursorAreVerticalLines) {
+TEST(Plot, EventsHaveMarksAndTheCursorALine) {
     Plot plot = plotOf({slope()});
     plot.events = {{kStart + seconds(15), "cell change"}};
     plot.cursor = kStart + seconds(45);
     plot.ahead = seconds(3600);
     EXPECT_EQ(drawn(plot, 50, 7), R"(
- -80 ┤           ┆        ⢀⡠⠤⢄⣀⡀       │
-     │           ┆    ⢀⡠⠔⠊⠁    ⠈⠉⠉⠒⠒⠤⠤⣀⡀
-     │           ┆⢀⡠⠔⠊⠁                ⠈⠉⠑⠒⠤⠤⣀⡀
+ -80 ┤                    ⢀⡠⠤⢄⣀⡀       │
+     │                ⢀⡠⠔⠊⠁    ⠈⠉⠉⠒⠒⠤⠤⣀⡀
+     │            ⢀⡠⠔⠊⠁                ⠈⠉⠑⠒⠤⠤⣀⡀
  -90 ┤        ⢀⡠⠔⠊⠁                    │      ⠈⠉⠑⠂
-     │    ⢀⡠⠔⠊⠁  ┆                     │
+     │    ⢀⡠⠔⠊⠁                        │
 -100 ┤⣀⠤⠒⠉⠁      ┆                     │
- dBm └── 23:13:30┆──────────── 23:14:00 ──────────
+ dBm └── 23:13:30 ──────────── 23:14:00 ──────────
 )");
     EXPECT_EQ(drawn(plot, 50, 7, kAsciiMarks), R"(
- -80 +           :                     |
-     |           :      ***************|
-     |           : *****               *******
+ -80 +                                 |
+     |                  ***************|
+     |             *****               *******
  -90 +         ****                    |      ****
-     |    *****  :                     |
+     |    *****                        |
 -100 +****       :                     |
- dBm +-- 23:13:30:------------ 23:14:00 ----------
+ dBm +-- 23:13:30 ------------ 23:14:00 ----------
 )");
 }
 

@@ -26,7 +26,9 @@ public:
         : frontEnd({[this] { ++displays; }, [this] { ++quits; },
                     [this](const std::string& text) { copied.push_back(text); },
                     [this] { ++repaints; }, [this] { ++startsAfresh; }, [this] { return zone; },
-                    [this] { return overview; }},
+                    [this] { return overview; }, [this] { return moment; },
+                    [this] { return values; }, [this]() -> const NetworkNames& { return names; },
+                    [this] { return displayTime; }},
                    marks),
           _window(frontEnd.toolkit().makeWindow({})) {
         auto root = std::make_shared<PallaxPaneController>(frontEnd.toolkit(), *this, nullptr, "/");
@@ -45,6 +47,10 @@ public:
     std::string zone; ///< of the status text's time
     std::vector<std::string> copied;
     Overview overview; ///< what the overview shows
+    Moment moment;
+    const CurrentValues* values = nullptr; ///< without a timeline
+    NetworkNames names;
+    DisplayTime displayTime;
 
     bool savingAllowed = true;
     std::optional<std::string> status; ///< null: follows the connection

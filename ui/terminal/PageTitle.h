@@ -1,0 +1,17 @@
+#pragma once
+
+#include "ui/terminal/Bars.h"
+
+#include <string>
+#include <string_view>
+
+namespace pallax::terminal {
+
+/// The title of a page and, where there is room, the origin of the values. A title that does not
+/// fit is cut at its beginning.
+void drawPageTitle(Grid& grid, const Marks& marks, Bars& bars, std::string_view title);
+
+/// The words of an event, without the arrow in a locale that does not have it.
+std::string eventWords(std::string words, const Marks& marks);
+
+} // namespace pallax::terminal
