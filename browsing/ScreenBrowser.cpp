@@ -16,6 +16,16 @@ namespace {
 
 constexpr std::chrono::milliseconds kTurnInterval{150};
 
+/// The terminal's marks, with the curves of the settings unless they must be ASCII.
+terminal::Marks marksWith(terminal::Marks marks, CurveCharacters curves) {
+    if (!marks.asciiOnly && curves == CurveCharacters::Blocks) {
+        marks.curves = terminal::Curves::Blocks;
+    } else if (curves == CurveCharacters::Ascii) {
+        marks.curves = terminal::Curves::Ascii;
+    }
+    return marks;
+}
+
 } // namespace
 
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
@@ -23,8 +33,8 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                              terminal::CursesTerminal& terminal, StandardOutput& notices)
     : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, notices),
       _keys(_link.queue(), terminal.inputDescriptor()), _watch(_link.resources()),
-      _frontEnd(frontEndSurroundings(), terminal.marks()),
-      _preferences(FilePreferences::userFolder()),
+      _marks(marksWith(terminal.marks(), settings.curves)),
+      _frontEnd(frontEndSurroundings(), _marks), _preferences(FilePreferences::userFolder()),
       _session(sessionSurroundings(std::move(source), settings)) {
     if (settings.firstScreen == FirstScreen::Overview) {
         _frontEnd.openOverview();

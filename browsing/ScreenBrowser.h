@@ -49,6 +49,7 @@ private:
     DescriptorWatch _keys;
     StatusWatch _watch;
     std::optional<NetworkNames> _names; ///< read when a page asks for the first time
+    const terminal::Marks _marks;
     terminal::FrontEnd _frontEnd;
     HostFileSystem _files;
     FilePreferences _preferences;

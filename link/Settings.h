@@ -19,12 +19,16 @@ enum class AfterReconnect { Keep, Fresh };
 /// The screen that a viewer opens with.
 enum class FirstScreen { Panes, Overview };
 
+/// What curves are drawn with where the terminal can show more than ASCII.
+enum class CurveCharacters { Braille, Blocks, Ascii };
+
 /// The contents of the settings file; without one, the defaults. Lines are `key = value`, empty, or
 /// a comment from "#" on its own line.
 struct Settings {
     AfterReconnect afterReconnect = AfterReconnect::Keep; ///< after-reconnect = keep | fresh
     OnFatalRecord onFatalRecord = OnFatalRecord::Stop;    ///< on-fatal-record = stop | skip
     FirstScreen firstScreen = FirstScreen::Panes;         ///< first-screen = panes | overview
+    CurveCharacters curves = CurveCharacters::Braille;    ///< curves = braille | blocks | ascii
     std::optional<std::string> snapshotDirectory;         ///< snapshot-directory = PATH
     std::optional<std::string> saveButtonMarker;          ///< save-button-marker = PATH
     int systemLogLevel = kSyslogLevel;                    ///< system-log-level = 0 ... 7

@@ -41,6 +41,11 @@ TEST(Settings, AreReadLineByLine) {
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{64} << 30U);
     EXPECT_EQ(parseSettings("after-reconnect = keep", "pallax.conf")->afterReconnect,
               AfterReconnect::Keep);
+    for (const auto& [word, curves] : {std::pair("braille", CurveCharacters::Braille),
+                                       std::pair("blocks", CurveCharacters::Blocks),
+                                       std::pair("ascii", CurveCharacters::Ascii)}) {
+        EXPECT_EQ(parseSettings(std::string("curves = ") + word, "pallax.conf")->curves, curves);
+    }
     EXPECT_EQ(parseSettings("first-screen = panes", "pallax.conf")->firstScreen,
               FirstScreen::Panes);
 }
@@ -54,6 +59,7 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
     EXPECT_EQ(settings->systemLogLevel, 3);
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Keep);
     EXPECT_EQ(settings->firstScreen, FirstScreen::Panes);
+    EXPECT_EQ(settings->curves, CurveCharacters::Braille);
     EXPECT_EQ(settings->journal.age, std::chrono::hours(24));
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{256} << 20U);
 }
@@ -67,6 +73,8 @@ TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
               "pallax.conf, line 1: after-reconnect is \"keep\" or \"fresh\", not \"never\".");
     EXPECT_EQ(sentenceFor("first-screen = graph"),
               "pallax.conf, line 1: first-screen is \"panes\" or \"overview\", not \"graph\".");
+    EXPECT_EQ(sentenceFor("curves = dots"),
+              "pallax.conf, line 1: curves is \"braille\", \"blocks\" or \"ascii\", not \"dots\".");
     EXPECT_EQ(sentenceFor("snapshot-directory ="),
               "pallax.conf, line 1: snapshot-directory needs a path.");
     for (const char* level : {"8", "-1", "4x", "", "warning", "99999999999"}) {
