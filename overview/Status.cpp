@@ -80,7 +80,8 @@ public:
 
 private:
     StatusValue valueOf(std::string_view name, std::string_view field, const FieldValue& value) {
-        return {std::string(name), std::string(field), value.text(), value.number, {}, value.read};
+        return {
+            std::string(name), std::string(field), value.text(), value.number, {}, value.read, {}};
     }
     StatusValue identityOf(const StatusField& field, const FieldValue& value) {
         StatusValue identity = valueOf(field.name, field.field, value);
@@ -244,6 +245,7 @@ void Gathering::addList(StatusCell& cell, const StatusCellFields& rule, const St
                                        ? isSame(cell, names)
                                        : value.text().starts_with(list.servingMark);
             StatusValue measured = levelOf(list.levelName, list.level, value);
+            measured.entry = _values.entries().words(entry.entry);
             if (isServing) {
                 const std::size_t mark = list.servingMark.size();
                 measured.text.erase(0, mark + (mark > 0 ? 1 : 0)); // and its blank

@@ -18,6 +18,7 @@ struct StatusValue {
     double number = 0.0;
     std::optional<Grade> grade; ///< nothing where the profile does not judge the field
     Time read;
+    std::string entry = {}; ///< the words of the list's entry that has the value
 };
 
 struct StatusCell {

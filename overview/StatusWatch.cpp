@@ -24,8 +24,12 @@ void StatusWatch::begin(std::string_view technology) {
 
 Overview StatusWatch::overview(Time time, const NetworkNames& names,
                                const QualityProfile& profile) const {
-    return _known ? Overview{statusOf(_known->values, time, names, profile), _known->events}
-                  : Overview();
+    Overview overview;
+    if (_known) {
+        overview.status = statusOf(_known->values, time, names, profile);
+        overview.events = _known->events;
+    }
+    return overview;
 }
 
 void StatusWatch::beginPacket(const SamplePacket& packet) {

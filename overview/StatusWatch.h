@@ -2,8 +2,10 @@
 
 #include "overview/Status.h"
 #include "packets/StampSequence.h"
+#include "timeline/Curve.h"
 #include "timeline/Event.h"
 #include "timeline/EventFinder.h"
+#include "timeline/LeafField.h"
 
 #include <memory>
 #include <string_view>
@@ -18,6 +20,14 @@ struct Overview {
     Status status;
     std::vector<Event> events;     ///< the latest last
     std::chrono::seconds ahead{0}; ///< local time minus UTC
+    /// The curves of levels over one time.
+    struct LevelCurve {
+        LeafName leaf;
+        Curve curve;
+    };
+    std::vector<LevelCurve> curves = {};
+    Time curvesFrom = {};
+    Time curvesTo = {};
 };
 
 /// Takes the samples of a live model, so that the status can be asked for at any time.

@@ -63,7 +63,9 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .origin = _origin,
                             .oldValues = _oldValues,
                             .zone = _surroundings.zone(),
-                            .press = [this](const KeyEvent& event) { handle(event); }};
+                            .press = [this](const KeyEvent& event) { handle(event); },
+                            .curve = [this](const std::string& path,
+                                            int columns) { return curveOfRow(path, columns); }};
     if (_pages.isOpen()) {
         _pages.draw({grid, _marks, _hits}, {navigation.screens().front()->title(),
                                             navigation.top().toolbarItems(), status});
@@ -73,7 +75,7 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
 }
 
 void FrontEnd::openOverview() {
-    _pages.open(OverviewPage(_surroundings.overview));
+    _pages.open(OverviewPage([this] { return overviewWithCurves(); }));
     needsDisplay();
 }
 

@@ -93,6 +93,8 @@ private:
     void openValue(PaneLeaf leaf);
     void openGraph();
     void handleValueKey(char32_t character);
+    std::string curveOfRow(const std::string& path, int columns);
+    Overview overviewWithCurves();
     void goBack(TerminalTable& table);
     void escape(TerminalTable& table);
     void save();

@@ -14,6 +14,7 @@ namespace pallax::terminal {
 namespace {
 
 constexpr Hint kClearFilter{"Esc clear filter", {.key = Key::Escape}};
+constexpr int kLeastColumnsForCurves = 100; // on a narrower screen rows have only name and value
 constexpr Style kBold{.bold = true};
 constexpr Style kDim{.dim = true};
 
@@ -67,7 +68,7 @@ void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
     table.setViewport(static_cast<std::size_t>(rows), rowContentBounds(_grid.columns()));
     Bars bars(_grid, _marks, _hits, status);
     drawTitle(navigation, table, bars);
-    drawRows(table);
+    drawRows(table, status);
     drawUpperRule(table, bars, status);
     const int ruleRight = drawLowerRule(table, static_cast<std::size_t>(rows), bars);
     if (status.filterEditor != nullptr) {
@@ -136,21 +137,24 @@ int PaneView::drawLowerRule(const TerminalTable& table, std::size_t windowRows, 
     return bars.drawRule(_grid.rows() - kRowsBelow, _marks.down, below, Key::PageDown);
 }
 
-void PaneView::drawRows(TerminalTable& table) {
+void PaneView::drawRows(TerminalTable& table, const PaneStatus& status) {
     const int end = _grid.rows() - kRowsBelow;
     std::size_t shown = table.firstShown();
     for (int y = kRowsAbove; y < end && shown < table.pane().shownRows(); ++y, ++shown) {
-        drawRow(table, shown, y);
+        drawRow(table, shown, y, status);
     }
 }
 
-void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y) {
+void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y, const PaneStatus& status) {
     const PaneModel& pane = table.pane();
     const std::size_t index = pane.rowAt(shown);
     const std::shared_ptr<ui::TableCell> cell = table.source().cellForRow(index);
     const PaneRow row = pane.row(index);
     const bool isSelected = shown == pane.cursor();
     drawCell(table, *cell, row, y, isSelected);
+    if (row.number && _grid.columns() >= kLeastColumnsForCurves) {
+        drawCurve(cell->contents(), status, childPath(pane.path(), row.name), y);
+    }
     if (isSelected) {
         _grid.put(0, y, _marks.cursor, {.accent = true});
     }
@@ -191,6 +195,20 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const P
         _grid.put(last - 1 - columnsOf(count), y, count, kDim);
     } else if (row.hasChanged) {
         _grid.put(last, y, _marks.changed, kBold);
+    }
+}
+
+/// In the same columns of each row, where name and value leave room.
+void PaneView::drawCurve(const ui::CellContents& contents, const PaneStatus& status,
+                         const std::string& path, int y) {
+    constexpr int kCurveColumns = 24;
+    constexpr int kValueColumns = 20; // of the usual values, with the margin
+    const int right = _grid.columns() - kValueColumns;
+    const ui::Label& name = *contents.labels.front();
+    const ui::Label& value = *contents.labels.back();
+    const int end = columnOf(name.frame.origin.x) + columnsOf(name.text);
+    if (end + kGap <= right - kCurveColumns && columnOf(value.frame.origin.x) >= right + kGap) {
+        _grid.put(right - kCurveColumns, y, status.curve(path, kCurveColumns), kDim);
     }
 }
 

@@ -23,8 +23,10 @@ private:
     void drawBreadcrumbs(TerminalNavigation& navigation, int right);
     void drawUpperRule(const TerminalTable& table, Bars& bars, const PaneStatus& status);
     int drawLowerRule(const TerminalTable& table, std::size_t windowRows, Bars& bars);
-    void drawRows(TerminalTable& table);
-    void drawRow(TerminalTable& table, std::size_t shown, int y);
+    void drawRows(TerminalTable& table, const PaneStatus& status);
+    void drawRow(TerminalTable& table, std::size_t shown, int y, const PaneStatus& status);
+    void drawCurve(const ui::CellContents& contents, const PaneStatus& status,
+                   const std::string& path, int y);
     void drawCell(const TerminalTable& table, ui::TableCell& cell, const PaneRow& row, int y,
                   bool isSelected);
     void drawLabel(const ui::Label& label, int x, int y, Style style, Span clip,

@@ -1,10 +1,20 @@
+#include "fields/Measures.h"
 #include "ui/terminal/FrontEnd.h"
 
+#include <chrono>
 #include <cmath>
 
 namespace pallax::terminal {
 
 namespace {
+
+constexpr std::chrono::minutes kSparklineSpan{5};
+/// So few that a timeline's reduction usually suffices, which costs nearly nothing.
+constexpr std::size_t kFewPoints = 8;
+
+bool isLevel(const FieldInfo& field) {
+    return measureOf(field.name) || field.unit == "dBm" || field.unit == "dB";
+}
 
 /// The text of the row of that name; nothing if there is none.
 std::optional<std::string> textOfRow(const PaneModel& pane, const std::string& name) {
@@ -78,6 +88,37 @@ void FrontEnd::handleValueKey(char32_t character) {
     const auto value = name ? valueOf(*_shown.values(), *name) : std::nullopt;
     const bool isNumber = value && name->inner.empty() && std::isfinite(value->value.number);
     setMessage(isNumber ? _graph.toggle(*name) : "Only numbers have a curve.");
+}
+
+/// A curve of the last minutes for a row that shows a level; empty for others.
+std::string FrontEnd::curveOfRow(const std::string& path, int columns) {
+    _shown.update();
+    const CurrentValues* values = _shown.hasTimeline() ? _shown.values() : nullptr;
+    const auto leaf = values != nullptr ? leafAt(*values, path) : std::nullopt;
+    const auto value = leaf && leaf->inner.empty() ? valueOf(*values, *leaf) : std::nullopt;
+    if (!value || !std::isfinite(value->value.number) || !isLevel(values->fields()[value->field])) {
+        return "";
+    }
+    const CurveWindow& window = _shown.choose(kSparklineSpan);
+    return sparkline(_marks, _shown.curve(*leaf, kFewPoints), window.from, window.to, columns);
+}
+
+Overview FrontEnd::overviewWithCurves() {
+    Overview overview = _surroundings.overview();
+    _shown.update();
+    if (!_shown.hasTimeline()) {
+        return overview;
+    }
+    const CurveWindow& window = _shown.choose(kSparklineSpan);
+    overview.curvesFrom = window.from;
+    overview.curvesTo = window.to;
+    for (const StatusCell& cell : overview.status.cells) {
+        for (const StatusValue& level : cell.levels) {
+            const LeafName leaf{level.field, level.entry, ""};
+            overview.curves.push_back({leaf, _shown.curve(leaf, kFewPoints)});
+        }
+    }
+    return overview;
 }
 
 } // namespace pallax::terminal

@@ -375,6 +375,72 @@ TEST_F(ValuePageTest, HelpAndQuittingWorkAsInAPane) {
     EXPECT_EQ(stage.quits, 0);
 }
 
+class RowCurvesTest : public ValueStage {};
+
+TEST_F(RowCurvesTest, AWideScreenHasCurvesInTheRowsOfLevels) {
+    show(last());
+    select(kMeasurements, kRsrp);
+    EXPECT_EQ(stage.screen(100, 16), R"(
+ Pallax › Serving Cell Measurements
+ ──────────────────────────────────────────────────────────────────────────────────────────── ↑ 4 ─
+▌Measured RSRP                                          ⠲⠒⠒⠒⠤⣤⢄⣀⣤⠶⠤⢤⠤⠒⣦⡤⢤⡤⠴⠶⠒⠉⠳⠴        -86.25 dBm
+ Average RSRP                                           ⠲⠒⠒⠒⠤⣤⢄⣀⣤⠦⠤⠤⠤⠒⣦⡤⢤⡤⠤⠶⠒⠉⠳⠴        -87.00 dBm
+ Measured RSRQ                                          ⠛⠓⠚⠋⠒⠾⠢⠤⣾⠛⠉⠓⠗⠉⠷⠖⢲⡖⠒⡟⠊⠉⠻⠚          -7.00 dB
+ Average RSRQ                                           ⠙⠑⠚⠉⠒⠺⠒⢤⣾⠋⠉⠛⠗⠉⠷⠖⢲⡖⠒⡟⠊⠉⠹⠊          -6.75 dB
+ Measured RSSI                                          ⠲⠒⠲⠦⠤⣤⢄⣀⣤⡤⠤⢤⡤⠒⣦⡤⢤⡤⠤⠶⠒⠉⠳⠤        -60.00 dBm
+ Qrxlevmin                                              ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤          -122 dBm
+ P_Max                                                  ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤            23 dBm
+ Max UE Tx Power                                        ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤            23 dBm
+ Srxlev                                                 ⠲⠒⠒⠒⠤⣤⢄⣀⣤⠦⠤⠤⠤⠒⣦⡤⢤⡤⠤⠶⠒⠉⠳⠤            35 dBm
+ Num of Consecutive DRX Cycles of S < 0                                                          0
+ S Intra Search                                         ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤             62 dB
+ S Non Intra Search                                     ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤            26 dBm
+ ──────────────────────────────────────────────────────────────────────────────────────────── ↓ 2 ─
+ Updated 2023-11-14 at 22:13:20                                            / filter  s Save  ? help
+)");
+    const std::string wide = stage.screen(99, 16);
+    stage.moment = {};
+    EXPECT_EQ(stage.screen(99, 16), wide) << "a narrower screen has none";
+    EXPECT_EQ(stage.screen(100, 16).find("⠤"), std::string::npos)
+        << "nor a viewer without a timeline";
+}
+
+TEST_F(RowCurvesTest, TheyAreDim) {
+    show(last());
+    select(kMeasurements, kRsrp);
+    stage.frontEnd.resize(100, 16);
+    int dim = 0;
+    const Grid grid = draw();
+    for (int x = 0; x < 100; ++x) {
+        dim += grid.at(x, 5).style.dim && grid.at(x, 5).text != " " ? 1 : 0;
+    }
+    EXPECT_GT(dim, 10);
+}
+
+TEST_F(RowCurvesTest, TheOverviewHasThemBesideTheLevels) {
+    show(last());
+    const Status status = statusOf(drive.timeline->latestValues(), stage.displayTime.now,
+                                   stage.names, *builtInProfile(kDefaultProfile));
+    stage.overview.status.time = status.time;
+    stage.overview.status.cells = status.cells;
+    stage.type("o");
+    EXPECT_EQ(stage.screen(80, 10), R"(
+ Pallax › Overview
+ ──────────────────────────────────────────────────────────────────────────────
+ Cell        eNodeB 104467 sector 1 · PCI 185 · TAC 6700
+             EARFCN 1850 · band 3 · 1870.0 MHz · 61 s ago
+ Levels      RSRP  -86.25 dBm  excellent  ▆▆▆▆▁▁▁▁  ⠲⠒⠒⠒⠤⣤⢄⣀⣤⠶⠤⢤⠤⠒⣦⡤⢤⡤⠴⠶⠒⠉⠳⠴
+             RSRQ    -7.00 dB  excellent  ▆▆▆▆▆▆▁▁  ⠛⠓⠚⠋⠒⠾⠢⠤⣾⠛⠉⠓⠗⠉⠷⠖⢲⡖⠒⡟⠊⠉⠻⠚
+             quality by the profile
+
+ ──────────────────────────────────────────────────────────────────────────────
+ Updated 2023-11-14 at 22:13:20                                 o panes  ? help
+)");
+    EXPECT_EQ(faultOf(draw()), "");
+    stage.moment = {};
+    EXPECT_EQ(stage.screen(80, 10).find("⠤"), std::string::npos);
+}
+
 TEST(ValuePageProperty, AnyKeysAndSizesDrawAWholeScreen) {
     namespace any = doubles::any;
     EXPECT_TRUE(doubles::holds([] {

@@ -48,6 +48,7 @@ protected:
         }
     }
     void select(const std::string& pane, const std::string& row) { select(stage, pane, row); }
+    Grid draw() { return stage.frontEnd.draw(); }
     bool shows(const std::string& text) { return stage.screen().find(text) != std::string::npos; }
     std::uint64_t last() const { return drive.timeline->packets(); }
 
