@@ -112,47 +112,13 @@ std::string ValuePage::title(std::string_view root, const Marks& marks,
 
 void ValuePage::draw(const PageScreen& screen, const PageSurroundings& around) {
     Grid& grid = screen.grid;
-    const Marks& marks = screen.marks;
     const Content content = this->content();
-    const ValueFacts& facts = content.facts;
-    const int right = grid.columns() - kMargin;
-    const Span room{kMargin, right};
-    const int end = grid.rows() - kRowsBelow;
-    Bars bars(grid, marks, screen.hits, around.status);
-    drawPageTitle(grid, marks, bars, title(around.root, marks, content));
-    (void)bars.drawRule(kRowsAbove - 1, marks.up, 0, Key::PageUp);
-
-    int y = kRowsAbove;
-    const std::string age =
-        content.read ? ageText(_shown.time().now - *content.read) : std::string();
-    const int ageAt = right - columnsOf(age);
-    int x =
-        grid.put(kMargin, y, facts.text.empty() ? "no value now" : facts.text, kValueStyle, room);
-    std::vector<std::string> lines;
-    if (!facts.grade.empty()) {
-        const std::string borders = " (" + facts.borders + ")";
-        x = grid.put(x + kGap, y, facts.grade, {}, room);
-        if (x + columnsOf(borders) + kGap <= ageAt) {
-            (void)grid.put(x, y, borders, kPaleFact);
-        } else {
-            lines.push_back(facts.borders);
-        }
-    }
-    grid.put(std::max(ageAt, x + kGap), y++, age, kPaleFact, room);
-    lines.insert(lines.end(), {facts.meaning, joinedBy(marks.dot, facts.knowledge),
-                               joinedBy(marks.dot, facts.origin),
-                               facts.range.empty() ? "" : "range " + facts.range});
-    const int past =
-        content.hasCurve && end - y > 2 * kLeastCurveRows - 2 ? end - kLeastCurveRows : end;
-    for (const std::string& line : lines) {
-        for (const std::string& part : wrappedAtBlanks(line, right - kMargin)) {
-            if (!part.empty() && y < past) {
-                grid.put(kMargin, y++, part, {}, room);
-            }
-        }
-    }
-    drawCurve(screen, content, y);
-    const int ruleRight = bars.drawRule(grid.rows() - kRowsBelow, marks.down, 0, Key::PageDown);
+    Bars bars(grid, screen.marks, screen.hits, around.status);
+    drawPageTitle(grid, screen.marks, bars, title(around.root, screen.marks, content));
+    (void)bars.drawRule(kRowsAbove - 1, screen.marks.up, 0, Key::PageUp);
+    drawCurve(screen, content, drawFacts(screen, content));
+    const int ruleRight =
+        bars.drawRule(grid.rows() - kRowsBelow, screen.marks.down, 0, Key::PageDown);
     std::vector<Hint> hints;
     if (content.hasCurve) {
         hints = {{"- + zoom", typed(U'+')}, {"v graph", typed(U'v')}};
@@ -160,6 +126,56 @@ void ValuePage::draw(const PageScreen& screen, const PageSurroundings& around) {
     hints.push_back({"y copy", typed(U'y')});
     hints.push_back({"? help", typed(U'?')});
     bars.drawHints(hints, bars.drawStatus(around.items, ruleRight));
+}
+
+/// The row of the value, with its quality and age. Returns what had no room.
+std::string ValuePage::drawValue(const PageScreen& screen, const Content& content) const {
+    Grid& grid = screen.grid;
+    const ValueFacts& facts = content.facts;
+    const Span room{kMargin, grid.columns() - kMargin};
+    const std::string age =
+        content.read ? ageText(_shown.time().now - *content.read) : std::string();
+    const int ageAt = room.right - columnsOf(age);
+    const std::string text = facts.text.empty() ? "no value now" : facts.text;
+    int x = grid.put(kMargin, kRowsAbove, text, kValueStyle, room);
+    if (x > room.right) {
+        grid.put(room.right - 1, kRowsAbove, screen.marks.more, kPaleFact);
+    }
+    std::string left;
+    if (!facts.grade.empty()) {
+        const std::string borders = " (" + facts.borders + ")";
+        x = grid.put(x + kGap, kRowsAbove, facts.grade, {}, room);
+        if (x + columnsOf(borders) + kGap <= ageAt) {
+            (void)grid.put(x, kRowsAbove, borders, kPaleFact);
+        } else {
+            left = facts.borders;
+        }
+    }
+    grid.put(std::max(ageAt, x + kGap), kRowsAbove, age, kPaleFact, room);
+    return left;
+}
+
+/// Leaves room for a curve. Returns the row after the facts.
+int ValuePage::drawFacts(const PageScreen& screen, const Content& content) const {
+    Grid& grid = screen.grid;
+    const ValueFacts& facts = content.facts;
+    const Span room{kMargin, grid.columns() - kMargin};
+    const std::vector<std::string> lines{drawValue(screen, content), facts.meaning,
+                                         joinedBy(screen.marks.dot, facts.knowledge),
+                                         joinedBy(screen.marks.dot, facts.origin),
+                                         facts.range.empty() ? "" : "range " + facts.range};
+    int y = kRowsAbove + 1;
+    const int end = grid.rows() - kRowsBelow;
+    const bool hasRoom = end - y > 2 * (kLeastCurveRows - 1);
+    const int past = content.hasCurve && hasRoom ? end - kLeastCurveRows : end;
+    for (const std::string& line : lines) {
+        for (const std::string& part : wrappedAtBlanks(line, room.right - room.left)) {
+            if (!part.empty() && y < past) {
+                grid.put(kMargin, y++, part, {}, room);
+            }
+        }
+    }
+    return y;
 }
 
 void ValuePage::drawCurve(const PageScreen& screen, const Content& content, int top) {

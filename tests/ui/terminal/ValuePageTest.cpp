@@ -3,7 +3,6 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
 #include <array>
 #include <string>
 
@@ -21,168 +20,7 @@ protected:
         stage.type("i");
         (void)stage.screen(); // the keys refer to the shown curve
     }
-    std::string screenOf(int columns, int rows, const Marks& marks = kUtf8Marks) {
-        TerminalStage another(marks);
-        another.frontEnd.setOrigin({"Zorell_LTE", "drive.pcap"});
-        show(another, last());
-        select(another, kMeasurements, kRsrp);
-        another.type("i");
-        const std::string screen = another.screen(columns, rows);
-        EXPECT_EQ(faultOf(another.frontEnd.draw()), "");
-        return screen;
-    }
 };
-
-TEST_F(ValuePageTest, TellsEverythingAboutAValue) {
-    EXPECT_EQ(screenOf(80, 24), R"(
- Pallax › Serving Cell Measurements › Measured RSRP     Zorell_LTE · drive.pcap
- ──────────────────────────────────────────────────────────────────────────────
- -86.25 dBm  excellent                                                  1 s old
- android: poor -128, fair -118, good -108, excellent -98
- Reference signal received power of the serving cell, as last measured.
- raw 215 x 0.25 - 140 · bits 0-8 of bytes 21-22 · log code 0xB17F · packet
- 16798
- range -140 to -12.25
-  -70 ┤
-      │                                                                 ⣆⣰
-      │                                                                 ⢿⣿⡇
-      │⢰                                                         ⣼⡀       ⣇
-  -80 ┤⣾⣿⢰⡇   ⢀⣷⡀                                ⡆              ⢀⣿⣧       ⢿
-      │⠇⢹⣸⠁   ⡟⠹⢷                 ⢠⡆             ⡇              ⢸⠉⢹       ⢸
-      │ ⠘⣿      ⠈                ⡀⢸⢿⡆    ⡀ ⢰     ⡇             ⣼⣸ ⠸       ⠸⡆  ⢸
-  -90 ┤  ⠇            ⡄⡄⢰      ⢀ ⣷⣿⠘⠁   ⢻⣿ ⣼⡇    ⢻⡆ ⢀   ⢰⡆ ⡇   ⠘⡿          ⠇
-      │               ⣧⢧⣾      ⣾⣶⡟⠛     ⠘⢹⣼⣿⠃    ⠘⣧⣶⡾    ⢧⢸⠇
-      │               ⢹⢸⡟     ⢀⣿⢹⠇       ⠈⠏⠉      ⢿⡿⠇    ⢸⣿
-      │                ⠸      ⢸⡿⢸                  ⠁     ⢸⢿
- -100 ┤┆  ┆┆  ┆ ┆     ┆ ┆┆ ┆  ⠈⠃ ┆  ┆ ┆ ┆  ┆┆ ┆  ┆  ┆  ┆┆⠘┆┆   ┆┆ ┆     ┆  ┆  ┆
-  dBm └┆──┆┆─ 22:16 ──┆─┆┆─┆ 22:17 ─┆─┆─┆─ 22:18 ┆──┆──┆ 22:19 ┆┆─┆──── 22:20 ┆
- min -98.5  mean about -87.56  max -73 dBm  of the last 5 minutes
- ──────────────────────────────────────────────────────────────────────────────
- Updated 2023-11-14 at 22:13:20               - + zoom  v graph  y copy  ? help
-)");
-}
-
-TEST_F(ValuePageTest, FitsANarrowScreen) {
-    EXPECT_EQ(screenOf(40, 20), R"(
- …ing Cell Measurements › Measured RSRP
- ──────────────────────────────────────
- -86.25 dBm  excellent          1 s old
- android: poor -128, fair -118, good
- -108, excellent -98
- Reference signal received power of the
- serving cell, as last measured.
- raw 215 x 0.25 - 140 · bits 0-8 of
- bytes 21-22 · log code 0xB17F · packet
- 16798
- range -140 to -12.25
-  -60 ┤
-      │                            ⢀⣤
-  -80 ┤⣦⡄ ⣠⡄       ⣀     ⢠      ⢰⣇ ⠈⠹⡆
-      │⠸⠃ ⠁⠁ ⢠⣤  ⢀⣴⡟ ⢰⣦⣧ ⢸⣄⡄ ⣄⡆ ⠿⠘   ⠇⠘
- -100 ┤┆┆┆┆┆ ⠈⠛┆┆⠾⠻┆ ┆⠈⠁┆┆⠛⠁┆⠻⠁ ┆┆ ┆ ┆┆
-  dBm └┆ 22:16 ┆┆┆┆┆─ 22:18 ┆┆┆─┆┆─┆─┆┆
- min -98.5  mean about -87.56  max -73
- ──────────────────────────────────────
- Updated 2023-11-14 at 22:13:20  ? help
-)");
-}
-
-TEST_F(ValuePageTest, UsesAWideScreen) {
-    EXPECT_EQ(screenOf(200, 60), R"(
- Pallax › Serving Cell Measurements › Measured RSRP                                                                                                                             Zorell_LTE · drive.pcap
- ──────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────
- -86.25 dBm  excellent (android: poor -128, fair -118, good -108, excellent -98)                                                                                                                1 s old
- Reference signal received power of the serving cell, as last measured.
- raw 215 x 0.25 - 140 · bits 0-8 of bytes 21-22 · log code 0xB17F · packet 16798
- range -140 to -12.25
-  -72 ┤
-      │                                                                                                                                                                                 ⢀
-      │                                                                                                                                                                              ⡆  ⢸
-  -74 ┤                                                                                                                                                                             ⢠⡇  ⢸
-      │                                                                                                                                                                             ⢸⡇⣧⡇⣼⣧
-      │                                                                                                                                                                             ⢸⣇⣿⣷⣿⣿
-      │                                                                                                                                                                             ⢸⣿⣿⣿⡇⣿
-  -76 ┤                                                                                                                                                                             ⢸⢿⣿⣿⡇⣿
-      │                                                                                                                                                                             ⠈⢸⣿⢹⡇⢿
-      │                                                                                                                                                                              ⠈⠉⠘ ⢸⡆
-  -78 ┤  ⡀                                                                                                                                                         ⢰⡆                    ⢸⡇
-      │ ⢠⡇                                                                                                                                                         ⢸⡇                     ⡇
-      │ ⢸⡇                                                                                                                                                         ⢸⡇                     ⣿
-      │ ⢸⡇                                                                                                                                                        ⣿⢸⣷                     ⣿⡀
-  -80 ┤ ⢸⡇⢀⡆   ⡀            ⢀                                                                                                                                     ⣿⢸⣿                     ⣿⡇
-      │ ⣼⢧⢸⡇  ⢠⣧            ⢸⡇⡄                                                                                        ⢠                                          ⣿⣼⣿                     ⢹⡇
-      │ ⣿⢸⣿⡇  ⢸⣿            ⢸⣧⡇                                                                                        ⢸                                          ⣿⣿⢹⡇                    ⠸⡇
-  -82 ┤ ⣿⢸⣿⢣  ⢸⡟            ⣸⣿⣇⣀                                                                                       ⢸                                         ⢸⡏⣿⢸⣿                     ⡇
-      │ ⡇⢸⣿⢸  ⢸⡇           ⣦⣿⢻⣿⣿                                                                                       ⢸                                        ⢰⣾⠃⡟⠘⣿                     ⡇
-      │ ⡇⠈⠇⢸  ⣼⠁          ⢸⣿⡏⢸⣿⣿                                                                                       ⢸                                        ⢸⣿ ⠁ ⢿                     ⣧
-      │ ⡇  ⢸  ⣿           ⣿⠿⠇⢸⣿⣿⣿⡄                                               ⢸⡄                                    ⢸                                        ⣿⡏   ⢸                     ⢿⡀
-  -84 ┤ ⠁  ⢸⡀ ⡏           ⣿  ⠈⠋⡟⣿⠃                                               ⢸⡇                                    ⢸                                        ⡟⡇   ⠘⡆                    ⢸⡇
-      │    ⠘⡇ ⡇           ⠃     ⡟                                                ⣾⣷                                    ⢸⡀                                       ⡇     ⡇                    ⢸⡇
-      │     ⣧⢠⡇                 ⠁                                                ⡇⢿⡄                                   ⢸⡇                                    ⢸  ⡇     ⡇                    ⢸⡇         ⢠
-      │     ⣿⣼⡇                                                                  ⡇⢸⡇                                    ⡇                                    ⢸  ⡇     ⣧                    ⠈⡇         ⢸
-  -86 ┤     ⢹⣿⡇                                                                  ⡇⢸⡇⣰                   ⢀⡇              ⡇                                    ⢸⢰ ⡇     ⣿                     ⡇         ⢸
-      │     ⢸⣿⡇                                                                 ⢰⡇⠘⣷⣿                   ⢸⡇              ⡇                                    ⣾⣾ ⡇                           ⡇         ⢸
-      │     ⢸⡇                                                               ⡇  ⢸  ⣿⣿             ⢸     ⢸⡇              ⡇                                    ⢹⣿⡇⡇                           ⢸         ⠸
-  -88 ┤     ⢸⡇                                                              ⢠⡇ ⢸⢸  ⠉⡿           ⡇⣤⣼⣇    ⢸⣿              ⡇                         ⢠          ⢸⣿⣿⡇                           ⢸⡀
-      │     ⢸                                         ⢀                     ⢸⣷⢀⣾⣼               ⣷⣿⣿⣿    ⢸⣿⢀             ⡇ ⡀                 ⡆     ⣾           ⢻⣿⡇                           ⢸⡇
-      │     ⠘                                  ⢰  ⡀   ⢸                     ⢸⣿⢸⣿⣿               ⣿⣿⣿⣿    ⣸⢻⣾             ⢷⣀⡇                 ⣇     ⣿            ⣿⡇                            ⠃
-      │                                        ⢸  ⣧   ⢸                  ⡄  ⢸⢹⣼⣿⣿               ⣿⠇⡇⢸    ⣿⢸⣿             ⢸⣿⡇                 ⢿    ⢠⣿            ⡿⡇
-  -90 ┤                                        ⢸⡀⢀⣿  ⢸⢸                  ⡇  ⢸⠸⣿⠉⡟               ⡿ ⠇⢸  ⡄⣧⣿⠈⣿             ⢸⣿⡇     ⡇           ⢸⣄   ⣸⡿            ⠁⠁
-      │                                        ⢸⡇⢸⣿  ⢸⢸                ⢀ ⣷⣶ ⢸ ⡟ ⡇               ⡇  ⢸  ⣇⣿⣿ ⣿             ⠘⡟⡇   ⢀ ⣇           ⢸⣿   ⣿
-      │                                        ⠘⡇⢸⣿⡆ ⢸⡇                ⢸⡀⣿⣿⡆⣾ ⠃                 ⠃  ⢸⡆⡀⣿⣿⢻ ⠃               ⢸⢀⢰ ⢸ ⣿           ⢸⣿   ⣿
-  -92 ┤                                         ⡇⢸ ⡇ ⣾⡇                ⢸⡇⣿⣿⣿⡏                      ⠘⡇⣿⣿⣿⢸                 ⢸⢸⣼ ⣿⢠⡇            ⢸⡄  ⡿
-      │                                         ⣿⣸ ⡇ ⣿⡇                ⣼⡇⣿⣿⣿⡇                       ⣧⣿⣿⡏⢸                 ⢸⣾⣿ ⣿⣼⡇            ⢸⣧  ⡇
-      │                                         ⢸⣿ ⡇⣀⣿⡇                ⣿⡇⡇⡟⣿⡇                       ⣿⣿⠘⡇⢸                 ⢸⣿⣿⢰⣿⣿⡇            ⢸⣿⢀ ⡇
-      │                                         ⢸⣿ ⡇⣿⡟                 ⡇⣇⡇ ⢸⡇                       ⢻⡇                    ⢸⣿⣿⢸⣿⣿             ⢸⣿⣸ ⡇
-  -94 ┤                                         ⢸⣿ ⣧⣿⠇                 ⡇⣿⡇ ⢸⡇                       ⠸                     ⢸⡇⠈⣿⡏⠹             ⢸⣿⣿⢀⠇
-      │                                         ⠈⠏ ⣿⡿                ⢠ ⡇⢹⡇ ⢸⡇                                             ⠈⡇ ⣿⠁              ⢸⡿⣿⣼
-      │                                            ⣿⡇                ⢸⡆⡇⢸⡇ ⠈⡇                                                ⡇               ⢸⡇⣿⣿
-  -96 ┤                                            ⢻⡇                ⢸⡇⡇ ⡇  ⡇                                                                ⢸⡇⢻⣿
-      │                                            ⠸                 ⢸⣿⡇ ⠇  ⡇                                                                ⠘⡇⢸⣿
-      │                                                              ⢸⣿⡇    ⡇                                                                 ⡇⠸⢿
-      │                                                               ⣿⡇    ⡇                                                                 ⡇ ⢸
-  -98 ┤                                                               ⠛⡇                                                                      ⡇
-      │                                                                ⠁                                                                      ⠁
-      │
- -100 ┤ ┆      ┆   ┆      ┆      ┆             ┆     ┆ ┆     ┆       ┆ ┆ ┆  ┆       ┆      ┆    ┆       ┆  ┆     ┆     ┆        ┆       ┆   ┆ ┆  ┆┆┆         ┆  ┆     ┆             ┆        ┆        ┆
-  dBm └─ 22:15:30 ─┆──────┆ 22:16:00 ───────── 22:16:30 ─────┆──── 22:17:00 ┆───────┆ 22:17:30 ─┆─────── 22:18:00 ─────┆─── 22:18:30 ───┆───┆─ 22:19:00 ─────┆──┆─ 22:19:30 ────────┆ 22:20:00 ───────┆
- min -98.5  mean about -87.56  max -73 dBm  of the last 5 minutes
- ──────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────
- Updated 2023-11-14 at 22:13:20                                                                                                                                       - + zoom  v graph  y copy  ? help
-)");
-}
-
-TEST_F(ValuePageTest, NeedsOnlyAscii) {
-    const std::string screen = screenOf(80, 24, kAsciiMarks);
-    EXPECT_EQ(screen, R"(
- Pallax > Serving Cell Measurements > Measured RSRP      Zorell_LTE, drive.pcap
- ------------------------------------------------------------------------------
- -86.25 dBm  excellent                                                  1 s old
- android: poor -128, fair -118, good -108, excellent -98
- Reference signal received power of the serving cell, as last measured.
- raw 215 x 0.25 - 140, bits 0-8 of bytes 21-22, log code 0xB17F, packet 16798
- range -140 to -12.25
-  -70 +
-      |                                                                 **
-      |                                                                 ***
-      |*                                                         *      ***
-  -80 +****    *                                 *               **       *
-      |****   ***                  *             *              ***       *
-      |***    ***                 **       *     *             ** *       *   *
-      |  *                       ****   ** **    *      *  *   ** *       **  *
-  -90 +  *            ***      ****     *****    ****   ****   **          *
-      |               ***      ***      *****     ***    ***
-      |               ***     ****        *       ***    **
-      |                *      ***                        **
- -100 +:  ::  : :     : :: :  :: :  : : :  :: :  :  :  :::::   :: :     :  :  :
-  dBm +:--::- 22:16 --:-::-: 22:17 -:-:-:- 22:18 :--:--: 22:19 ::-:---- 22:20 :
- min -98.5  mean about -87.56  max -73 dBm  of the last 5 minutes
- ------------------------------------------------------------------------------
- Updated 2023-11-14 at 22:13:20               - + zoom  v graph  y copy  ? help
-)");
-    EXPECT_TRUE(std::all_of(screen.begin(), screen.end(),
-                            [](char each) { return static_cast<unsigned char>(each) < 0x80; }));
-}
 
 TEST_F(ValuePageTest, EnterOnALeafOpensItAndSomeKeysCloseIt) {
     show(last());
@@ -260,6 +98,14 @@ TEST_F(ValuePageTest, WithoutACurveLeftGoesBack) {
 )");
     stage.press(Key::Left);
     EXPECT_FALSE(shows("y copy"));
+}
+
+TEST_F(ValuePageTest, AValueThatDoesNotFitEndsInAMark) {
+    stage.tick(Dictionary{{"SIM Info", Dictionary{{"IMSI", std::string(200, '1')}}}});
+    select("SIM Info", "IMSI");
+    stage.type("i");
+    stage.frontEnd.resize(40, 10);
+    EXPECT_EQ(stage.line(2), " " + std::string(37, '1') + "…");
 }
 
 TEST_F(ValuePageTest, WithoutATimelineTheCurrentValuesTellTheRest) {
@@ -375,72 +221,6 @@ TEST_F(ValuePageTest, HelpAndQuittingWorkAsInAPane) {
     EXPECT_EQ(stage.quits, 0);
 }
 
-class RowCurvesTest : public ValueStage {};
-
-TEST_F(RowCurvesTest, AWideScreenHasCurvesInTheRowsOfLevels) {
-    show(last());
-    select(kMeasurements, kRsrp);
-    EXPECT_EQ(stage.screen(100, 16), R"(
- Pallax › Serving Cell Measurements
- ──────────────────────────────────────────────────────────────────────────────────────────── ↑ 4 ─
-▌Measured RSRP                                          ⠲⠒⠒⠒⠤⣤⢄⣀⣤⠶⠤⢤⠤⠒⣦⡤⢤⡤⠴⠶⠒⠉⠳⠴        -86.25 dBm
- Average RSRP                                           ⠲⠒⠒⠒⠤⣤⢄⣀⣤⠦⠤⠤⠤⠒⣦⡤⢤⡤⠤⠶⠒⠉⠳⠴        -87.00 dBm
- Measured RSRQ                                          ⠛⠓⠚⠋⠒⠾⠢⠤⣾⠛⠉⠓⠗⠉⠷⠖⢲⡖⠒⡟⠊⠉⠻⠚          -7.00 dB
- Average RSRQ                                           ⠙⠑⠚⠉⠒⠺⠒⢤⣾⠋⠉⠛⠗⠉⠷⠖⢲⡖⠒⡟⠊⠉⠹⠊          -6.75 dB
- Measured RSSI                                          ⠲⠒⠲⠦⠤⣤⢄⣀⣤⡤⠤⢤⡤⠒⣦⡤⢤⡤⠤⠶⠒⠉⠳⠤        -60.00 dBm
- Qrxlevmin                                              ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤          -122 dBm
- P_Max                                                  ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤            23 dBm
- Max UE Tx Power                                        ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤            23 dBm
- Srxlev                                                 ⠲⠒⠒⠒⠤⣤⢄⣀⣤⠦⠤⠤⠤⠒⣦⡤⢤⡤⠤⠶⠒⠉⠳⠤            35 dBm
- Num of Consecutive DRX Cycles of S < 0                                                          0
- S Intra Search                                         ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤             62 dB
- S Non Intra Search                                     ⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤⠤            26 dBm
- ──────────────────────────────────────────────────────────────────────────────────────────── ↓ 2 ─
- Updated 2023-11-14 at 22:13:20                                            / filter  s Save  ? help
-)");
-    const std::string wide = stage.screen(99, 16);
-    stage.moment = {};
-    EXPECT_EQ(stage.screen(99, 16), wide) << "a narrower screen has none";
-    EXPECT_EQ(stage.screen(100, 16).find("⠤"), std::string::npos)
-        << "nor a viewer without a timeline";
-}
-
-TEST_F(RowCurvesTest, TheyAreDim) {
-    show(last());
-    select(kMeasurements, kRsrp);
-    stage.frontEnd.resize(100, 16);
-    int dim = 0;
-    const Grid grid = draw();
-    for (int x = 0; x < 100; ++x) {
-        dim += grid.at(x, 5).style.dim && grid.at(x, 5).text != " " ? 1 : 0;
-    }
-    EXPECT_GT(dim, 10);
-}
-
-TEST_F(RowCurvesTest, TheOverviewHasThemBesideTheLevels) {
-    show(last());
-    const Status status = statusOf(drive.timeline->latestValues(), stage.displayTime.now,
-                                   stage.names, *builtInProfile(kDefaultProfile));
-    stage.overview.status.time = status.time;
-    stage.overview.status.cells = status.cells;
-    stage.type("o");
-    EXPECT_EQ(stage.screen(80, 10), R"(
- Pallax › Overview
- ──────────────────────────────────────────────────────────────────────────────
- Cell        eNodeB 104467 sector 1 · PCI 185 · TAC 6700
-             EARFCN 1850 · band 3 · 1870.0 MHz · 61 s ago
- Levels      RSRP  -86.25 dBm  excellent  ▆▆▆▆▁▁▁▁  ⠲⠒⠒⠒⠤⣤⢄⣀⣤⠶⠤⢤⠤⠒⣦⡤⢤⡤⠴⠶⠒⠉⠳⠴
-             RSRQ    -7.00 dB  excellent  ▆▆▆▆▆▆▁▁  ⠛⠓⠚⠋⠒⠾⠢⠤⣾⠛⠉⠓⠗⠉⠷⠖⢲⡖⠒⡟⠊⠉⠻⠚
-             quality by the profile
-
- ──────────────────────────────────────────────────────────────────────────────
- Updated 2023-11-14 at 22:13:20                                 o panes  ? help
-)");
-    EXPECT_EQ(faultOf(draw()), "");
-    stage.moment = {};
-    EXPECT_EQ(stage.screen(80, 10).find("⠤"), std::string::npos);
-}
-
 TEST(ValuePageProperty, AnyKeysAndSizesDrawAWholeScreen) {
     namespace any = doubles::any;
     EXPECT_TRUE(doubles::holds([] {
@@ -450,7 +230,7 @@ TEST(ValuePageProperty, AnyKeysAndSizesDrawAWholeScreen) {
         TerminalStage stage(any::between(0, 1) == 0 ? kUtf8Marks : kAsciiMarks);
         Timeline& timeline = *RecordedDrive::lte().timeline;
         for (int step = 0; step < 30; ++step) {
-            const auto instant = static_cast<std::uint64_t>(any::between(0, 2000) * 4 + 1);
+            const auto instant = static_cast<std::uint64_t>(any::between(0, 300) * 4 + 1);
             stage.moment = {&timeline, instant};
             if (step % 10 == 0) {
                 stage.tick(timeline.displayAt(instant));
