@@ -22,7 +22,7 @@ PageAnswer GraphPage::handle(const KeyEvent& event) {
     return closes || goesBack(event) ? PageAnswer::Closes : PageAnswer::NotMine;
 }
 
-/// "a  -92.25 dBm  Serving Cell Measurements: Measured RSRP": now, or at the cursor.
+/// "a  -92.25 dBm  Measured RSRP, Serving Cell Measurements": now, or at the cursor.
 std::string GraphPage::legendOf(const LeafName& leaf, const FieldInfo& field,
                                 const PlotCurve& curve, const CurrentValues& values) const {
     std::string value = "no value";
@@ -34,9 +34,9 @@ std::string GraphPage::legendOf(const LeafName& leaf, const FieldInfo& field,
     } else if (const auto current = valueOf(values, leaf)) {
         value = current->value.text();
     }
-    std::string words = curve.mark + "  " + value + "  " + field.section;
-    words.append(leaf.entry.empty() ? "" : ", ").append(leaf.entry);
-    return words.append(field.key.empty() ? "" : ": ").append(field.key);
+    std::string words = curve.mark + "  " + value + "  " + field.key;
+    words.append(field.key.empty() ? "" : ", ").append(leaf.entry);
+    return words.append(leaf.entry.empty() ? "" : ", ").append(field.section);
 }
 
 std::vector<GraphPage::Group> GraphPage::groups(int columns) {
@@ -52,7 +52,7 @@ std::vector<GraphPage::Group> GraphPage::groups(int columns) {
         }
         const FieldInfo& field = values->fields()[*index];
         PlotCurve curve{std::string(1, mark++),
-                        _shown.curve(leaf, static_cast<std::size_t>(columns) * 2)};
+                        _shown.curve(leaf, static_cast<std::size_t>(columns))};
         auto group = std::find_if(groups.begin(), groups.end(), [&field](const Group& each) {
             return each.plot.unit == field.unit;
         });

@@ -186,12 +186,12 @@ void ValuePage::drawCurve(const PageScreen& screen, const Content& content, int 
     if (!content.hasCurve || area.rows < kLeastCurveRows - 1) {
         return _keys.fit({}, {}, 0);
     }
-    const auto dots = static_cast<std::size_t>(area.columns) * 2;
+    const auto points = static_cast<std::size_t>(area.columns);
     Plot plot{window.from,
               window.to,
               _shown.time().ahead,
               content.field->unit,
-              {{"", _shown.curve(*_name, dots)}},
+              {{"", _shown.curve(*_name, points)}},
               _shown.events(),
               {}};
     const int labels = labelColumns(plot, area.rows);

@@ -36,8 +36,8 @@ TEST_F(GraphPageTest, ValuesOfOneUnitShareAPlot) {
     EXPECT_EQ(screenOf(80, 24), R"(
  Pallax › Graph
  ──────────────────────────────────────────────────────────────────────────────
- a  -86.25 dBm  Serving Cell Measurements: Measured RSRP
- b  -87.00 dBm  Serving Cell Measurements: Average RSRP
+ a  -86.25 dBm  Measured RSRP, Serving Cell Measurements
+ b  -87.00 dBm  Average RSRP, Serving Cell Measurements
   -60 ┤
       │
       │                                                               ⣦⣴⡄
@@ -46,7 +46,7 @@ TEST_F(GraphPageTest, ValuesOfOneUnitShareAPlot) {
       │  ⠁           ⠘⡾⣾⡇    ⢀⣴⡷⡟⠛     ⠘⠹⡾⠿⠃    ⠛⣷⣶⡇   ⠘⣧⡾    ⠉          ⠁    b
  -100 ┤┆  ┆┆  ┆ ┆    ┆ ⠃┆ ┆  ⠘⠏⠃⠃  ┆ ┆ ┆  ┆┆ ┆  ┆⠁⠁┆  ┆┆⠟⠃┆  ┆┆  ┆    ┆  ┆  ┆
   dBm └┆──┆┆─ 22:16 ─┆─┆┆─┆ 22:17 ─┆─┆─┆─ 22:18 ┆──┆──┆ 22:19 ┆──┆─── 22:20 ┆
- c  -7.00 dB  Serving Cell Measurements: Measured RSRQ
+ c  -7.00 dB  Measured RSRQ, Serving Cell Measurements
    -5 ┤⣴⣄     ⢰⣶⡆               ⢀⢀⣦⡄    ⡀       ⡆              ⣠⣶     ⣿⣷⣶   ⢀
       │⠛⢿⣾⡇   ⣾⠘⠃    ⢰⣰⣰⡇      ⢀⣿⣿⠙⠃   ⢻⣷⣀⢸     ⣷  ⡀   ⢰⡀⣴   ⢠⢠⠿⠻⡆    ⠈⠛⢻   ⢸ c
       │  ⠋    ⠛      ⠘⡿⣿⡇     ⣶⣾⡟      ⠘⢹⣿⣾⡇    ⠛⣷⣼⡇   ⠘⣇⡟   ⠘⣿  ⠁      ⠘⡇
@@ -65,18 +65,18 @@ TEST_F(GraphPageTest, FitsANarrowScreen) {
     EXPECT_EQ(screenOf(40, 20), R"(
  Pallax › Graph
  ──────────────────────────────────────
- a  -86.25 dBm  Serving Cell Measuremen
- b  -87.00 dBm  Serving Cell Measuremen
+ a  -86.25 dBm  Measured RSRP, Serving
+ b  -87.00 dBm  Average RSRP, Serving C
   -60 ┤
       │                           ⣤
   -80 ┤⣦⡄ ⣤⡀      ⢀     ⢠     ⢀⣾  ⠙⡇
-      │⠸⠃ ⠉⠁ ⣤⡄  ⣴⡾⠃⢰⢦⣧ ⢸⣤⡀⢠⣴ ⠸⠙   ⠇⠘ a
+      │⠸⠃ ⠉⠁ ⣤⡄  ⣴⡾⠃⢰⢦⣧ ⢸⣤⡀⢠⣴ ⠸⠙   ⠗⠛ a
  -100 ┤┆┆ ┆┆ ⠙⠃┆⠰⠿ ┆┆⠈⠁┆┆⠛┆┆⠿┆┆┆  ┆┆┆ b
   dBm └┆ 22:16 ┆┆┆─┆ 22:18 ┆┆┆┆┆──┆┆┆
- c  -7.00 dB  Serving Cell Measurements
+ c  -7.00 dB  Measured RSRQ, Serving Ce
    -5 ┤⣶⡀ ⣾⠆ ⢀⡀  ⢠⣼⡆⢀⡄⡀ ⢰   ⢀  ⣾  ⣿⡆⢠
-      │⢹⠇ ⡇  ⣿⡇  ⣼⡏⠁⠸⢷⡇ ⢸⣴⡀⢸⣾ ⢸⠹  ⠈⡇⠘ c
-  -10 ┤      ⢹⡇ ⢀⣿   ⠘⣿  ⣿⠃ ⣿ ⢸    ⡇
+      │⢹⠇ ⡇  ⣿⡇  ⣼⡏⠁⠸⢷⡇ ⢸⣴⡀⢸⣾ ⢸⠹  ⠈⡇⡞ c
+  -10 ┤      ⢹⡇ ⢀⣿   ⠘⣿  ⣿⠃ ⣿ ⢸    ⡟
       │      ⠈⠃ ⢸⣿    ⡇  ⠁  ⣿ ⢸    ⠁
   -15 ┤┆┆ ┆┆ ┆┆┆┆⠛ ┆┆ ┆┆┆ ┆┆⣿┆⠸┆  ┆┆┆
    dB └┆ 22:16 ┆┆┆─┆ 22:18 ┆┆┆┆┆──┆┆┆
@@ -90,8 +90,8 @@ TEST_F(GraphPageTest, UsesAWideScreen) {
     EXPECT_EQ(screenOf(200, 60), R"(
  Pallax › Graph
  ──────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────
- a  -86.25 dBm  Serving Cell Measurements: Measured RSRP
- b  -87.00 dBm  Serving Cell Measurements: Average RSRP
+ a  -86.25 dBm  Measured RSRP, Serving Cell Measurements
+ b  -87.00 dBm  Average RSRP, Serving Cell Measurements
   -70 ┤
       │
       │                                                                                                                                                                            ⡀  ⢠
@@ -118,7 +118,7 @@ TEST_F(GraphPageTest, UsesAWideScreen) {
       │                                                              ⠉⠇    ⠈                                                                ⠸  ⠁
  -100 ┤ ┆      ┆  ┆       ┆     ┆              ┆     ┆┆     ┆        ┆┆ ┆  ┆        ┆     ┆    ┆       ┆  ┆     ┆     ┆        ┆      ┆   ┆ ┆  ┆ ┆┆        ┆  ┆      ┆            ┆        ┆        ┆
   dBm └─ 22:15:30 ┆───────┆ 22:16:00 ───────── 22:16:30 ────┆──── 22:17:00 ┆──────── 22:17:30 ─┆─────── 22:18:00 ─────┆─── 22:18:30 ──┆───┆─┆ 22:19:00 ────┆──┆─ 22:19:30 ────────┆ 22:20:00 ───────┆
- c  -7.00 dB  Serving Cell Measurements: Measured RSRQ
+ c  -7.00 dB  Measured RSRQ, Serving Cell Measurements
    -4 ┤
       │
       │                      ⡄⡄                                                  ⡄                                                                                ⣤                ⣧⣿⡇⢠⡄
@@ -156,8 +156,8 @@ TEST_F(GraphPageTest, NeedsOnlyAscii) {
     EXPECT_EQ(screen, R"(
  Pallax > Graph
  ------------------------------------------------------------------------------
- a  -86.25 dBm  Serving Cell Measurements: Measured RSRP
- b  -87.00 dBm  Serving Cell Measurements: Average RSRP
+ a  -86.25 dBm  Measured RSRP, Serving Cell Measurements
+ b  -87.00 dBm  Average RSRP, Serving Cell Measurements
   -60 +
       |
       |                                                               ***
@@ -166,7 +166,7 @@ TEST_F(GraphPageTest, NeedsOnlyAscii) {
       |              ****    *****     *****    ****   ***    *               b
  -100 +:  ::  : :    : :: :  **:*  : : :  :: :  :  :  ::**:  ::  :    :  :  :
   dBm +:--::- 22:16 -:-::-: 22:17 -:-:-:- 22:18 :--:--: 22:19 :--:--- 22:20 :
- c  -7.00 dB  Serving Cell Measurements: Measured RSRQ
+ c  -7.00 dB  Measured RSRQ, Serving Cell Measurements
    -5 +**     ***                 **            *              **     ***
       |****   ***    ****       ****   ** *     *      * *   *****    ***   * c
       | ***   *      ****     ****     *****    ****   ***   **  *      **  *
@@ -190,7 +190,7 @@ TEST_F(GraphPageTest, TheKeyPutsAValueInAndTakesItAway) {
     EXPECT_TRUE(shows("In the graph (1 of 6): V opens it."));
     stage.type("V");
     EXPECT_TRUE(shows("Pallax › Graph"));
-    EXPECT_TRUE(shows(" dBm  Serving Cell Measurements: Measured RSRP"));
+    EXPECT_TRUE(shows(" dBm  Measured RSRP, Serving Cell Measurements"));
     stage.type("V");
     EXPECT_EQ(stage.depth(), 2U);
     stage.type("v");
