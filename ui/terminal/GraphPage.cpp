@@ -105,7 +105,8 @@ void GraphPage::drawGroups(const PageScreen& screen, std::vector<Group> groups) 
         labels = std::max(labels, labelColumns(group.plot, grid.rows()));
     }
     const Plot& first = groups.front().plot;
-    _keys.fit(first.from, first.to, curveColumns(first, columns, labels));
+    const bool hasCurves = _shown.window().firstPacket <= _shown.window().lastPacket;
+    _keys.fit(first.from, first.to, hasCurves ? curveColumns(first, columns, labels) : 0);
     const int rows = (end - kRowsAbove - legends) / static_cast<int>(groups.size());
     int y = kRowsAbove;
     for (Group& group : groups) {
@@ -115,13 +116,13 @@ void GraphPage::drawGroups(const PageScreen& screen, std::vector<Group> groups) 
             }
         }
         const int height = std::min(std::max(rows, kLeastPlotRows), end - y);
-        if (height >= kLeastPlotRows) {
+        if (hasCurves && height >= kLeastPlotRows) {
             group.plot.cursor = _keys.cursor();
             drawPlot(grid, screen.marks, group.plot, {kMargin, y, columns, height}, labels);
             y += height;
         }
     }
-    std::string words(_keys.spanWords());
+    std::string words(hasCurves ? _keys.spanWords() : "There are no curves yet.");
     if (_keys.cursor()) {
         words = clockText(*_keys.cursor(), first.ahead);
         const std::string event = _keys.wordsAtCursor(first.events);

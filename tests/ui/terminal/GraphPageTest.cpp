@@ -238,6 +238,18 @@ TEST_F(GraphPageTest, TheCursorReadsAllCurves) {
     EXPECT_TRUE(shows("the last 15 minutes"));
 }
 
+TEST_F(GraphPageTest, WithoutATimelineThereAreOnlyValues) {
+    addLevels(stage);
+    stage.moment = {};
+    stage.values = &drive.timeline->latestValues();
+    stage.type("V");
+    EXPECT_TRUE(shows(" dBm  Measured RSRP, Serving Cell Measurements"));
+    EXPECT_TRUE(shows("\n There are no curves yet."));
+    EXPECT_FALSE(shows("└"));
+    stage.press(Key::Left);
+    EXPECT_FALSE(shows("Pallax › Graph"));
+}
+
 TEST_F(GraphPageTest, AnotherTechnologyHasNoneOfTheValues) {
     addLevels(stage);
     stage.type("V");
