@@ -22,6 +22,16 @@ namespace {
 constexpr std::chrono::milliseconds kTurnInterval{150};
 constexpr std::chrono::milliseconds kSilentWork{100};
 
+/// The terminal's marks, with the curves of the settings unless they must be ASCII.
+terminal::Marks marksWith(terminal::Marks marks, CurveCharacters curves) {
+    if (!marks.asciiOnly && curves == CurveCharacters::Blocks) {
+        marks.curves = terminal::Curves::Blocks;
+    } else if (curves == CurveCharacters::Ascii) {
+        marks.curves = terminal::Curves::Ascii;
+    }
+    return marks;
+}
+
 } // namespace
 
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
@@ -44,8 +54,9 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                [this](const auto& text) {
                    _frontEnd.toolkit().showAlert({"Alarms that are left out", text, "Close"});
                }}),
-      _frontEnd(frontEndSurroundings(), terminal.marks()),
-      _preferences(FilePreferences::userFolder()), _session(sessionSurroundings(source, settings)) {
+      _marks(marksWith(terminal.marks(), settings.curves)),
+      _frontEnd(frontEndSurroundings(), _marks), _preferences(FilePreferences::userFolder()),
+      _session(sessionSurroundings(source, settings)) {
     _frontEnd.showListsAsTables(settings.lists == Lists::Table);
     if (settings.firstScreen == FirstScreen::Overview) {
         _frontEnd.openOverview();
@@ -66,6 +77,14 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
             .overview = [this] { return overview(); },
             .entryPart = [this](const auto& path) { return entryPart(path); },
             .moment = [this] { return _travel.moment(); },
+            .values = [this] { return _watch.values(); },
+            .names = [this]() -> const NetworkNames& { return names(); },
+            .time =
+                [this] {
+                    const Time now = _travel.isAway() ? _travel.time().value_or(_link.clock().now())
+                                                      : _link.clock().now();
+                    return terminal::DisplayTime{now, _link.clock().zone(now).offset};
+                },
             .goTo =
                 [this](std::uint64_t packet) {
                     if (const auto refusal = _travel.toInstant(packet)) {

@@ -66,7 +66,8 @@ private:
     std::chrono::steady_clock::time_point _lookedForKey;
     AlarmWatch _alarms;
     std::uint64_t _ticks = 0;
-    std::optional<NetworkNames> _names; ///< read when the overview is drawn for the first time
+    std::optional<NetworkNames> _names; ///< read when a page asks for the first time
+    const terminal::Marks _marks;
     terminal::FrontEnd _frontEnd;
     HostFileSystem _files;
     FilePreferences _preferences;

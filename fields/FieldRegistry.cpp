@@ -66,7 +66,8 @@ void addNumber(FieldInfo& info, Numbers& numbers, const FieldDescription& field)
 }
 
 /// Adds a row to its field.
-void addRow(FieldInfo& info, Numbers& numbers, const FieldDescription& field, LogCode logCode) {
+void addRow(FieldInfo& info, Numbers& numbers, const FieldDescription& field,
+            const FieldInfo::Place& place) {
     const Conversion& conversion = field.shownAs;
     if (conversion.format != nullptr) {
         addNumber(info, numbers, field);
@@ -83,12 +84,13 @@ void addRow(FieldInfo& info, Numbers& numbers, const FieldDescription& field, Lo
     if (field.condition && field.condition->otherwise.find('%') == std::string_view::npos) {
         addLabel(info.labels, field.condition->otherwise);
     }
-    if (std::find(info.codes.begin(), info.codes.end(), logCode) == info.codes.end()) {
-        info.codes.push_back(logCode);
+    if (std::find(info.codes.begin(), info.codes.end(), place.code) == info.codes.end()) {
+        info.codes.push_back(place.code);
     }
     info.identifies = info.identifies || field.identifies;
     info.isPersonal = info.isPersonal || field.isPersonal;
     info.rows.push_back(field.row);
+    info.places.push_back(place);
 }
 
 /// Walks the sections of a technology.
@@ -124,26 +126,26 @@ private:
         const std::string path = _path;
         _path += isEntries ? "/*" : "";
         _isInList = isEntries;
-        addParts(code.fields, code.lists, code.logCode);
+        addParts(code.fields, code.lists, {code.logCode, false});
         for (const SubpacketDescription& subpacket : code.subpackets) {
-            addParts(subpacket.fields, subpacket.lists, code.logCode);
+            addParts(subpacket.fields, subpacket.lists, {code.logCode, true});
         }
         _path = path;
         _isInList = false;
     }
 
     void addParts(const std::vector<FieldDescription>& fields,
-                  const std::vector<ListDescription>& lists, LogCode logCode) {
+                  const std::vector<ListDescription>& lists, const FieldInfo::Place& place) {
         for (const FieldDescription& field : fields) {
             FieldInfo& info = infoOf(field.key, kindOf(field));
-            addRow(info, _numbers[info.name], field, logCode);
+            addRow(info, _numbers[info.name], field, place);
         }
         for (const ListDescription& list : lists) {
-            addList(list, logCode);
+            addList(list, place);
         }
     }
 
-    void addList(const ListDescription& list, LogCode logCode) {
+    void addList(const ListDescription& list, const FieldInfo::Place& place) {
         const auto around = std::tuple(_name, _path, _listKey, _isInList, _isShown);
         if (!list.key.empty()) {
             _listKey = list.key;
@@ -156,7 +158,7 @@ private:
         if (list.entryName) {
             _identities[_path] = {std::string(kEntryName)};
         }
-        addParts(list.fields, list.lists, logCode);
+        addParts(list.fields, list.lists, place);
         std::tie(_name, _path, _listKey, _isInList, _isShown) = around;
     }
 

@@ -46,6 +46,12 @@ struct FieldInfo {
     bool isPersonal = false; ///< identifies a person, a device or a subscription
     bool isShown = true;
     std::vector<FieldId> rows; ///< in the technology's layouts
+    /// Where a row reads the field.
+    struct Place {
+        LogCode code;
+        bool isInSubpacket;
+    };
+    std::vector<Place> places; ///< of each row
     /// How its rows show raw numbers, where some have labels.
     std::vector<Conversion> labelled;
 

@@ -107,6 +107,17 @@ std::optional<std::string> takeAlarm(Settings& settings, std::string_view text) 
     return std::nullopt;
 }
 
+std::optional<std::string> takeCurves(Settings& settings, std::string_view text) {
+    constexpr std::array<std::string_view, 3> kWords{"braille", "blocks", "ascii"};
+    for (std::size_t index = 0; index < kWords.size(); ++index) {
+        if (text == kWords.at(index)) {
+            settings.curves = static_cast<CurveCharacters>(index);
+            return std::nullopt;
+        }
+    }
+    return formatText("curves is \"braille\", \"blocks\" or \"ascii\", not \"%@\"", {text});
+}
+
 /// Sets one setting; returns the reason if it cannot.
 std::optional<std::string> take(Settings& settings, std::string_view key, std::string_view value) {
     for (const ChoiceSetting& setting : kChoiceSettings) {
@@ -121,6 +132,9 @@ std::optional<std::string> take(Settings& settings, std::string_view key, std::s
     }
     if (key == "alarm") {
         return takeAlarm(settings, value);
+    }
+    if (key == "curves") {
+        return takeCurves(settings, value);
     }
     if (key != "snapshot-directory" && key != "save-button-marker") {
         return formatText("there is no setting \"%@\"", {key});

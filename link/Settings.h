@@ -22,6 +22,8 @@ enum class FirstScreen { Panes, Overview };
 
 /// How lists of the display are shown.
 enum class Lists { Rows, Table };
+/// What curves are drawn with where the terminal can show more than ASCII.
+enum class CurveCharacters { Braille, Blocks, Ascii };
 
 /// The contents of the settings file; without one, the defaults. Lines are `key = value`, empty, or
 /// a comment from "#" on its own line.
@@ -30,6 +32,7 @@ struct Settings {
     OnFatalRecord onFatalRecord = OnFatalRecord::Stop;    ///< on-fatal-record = stop | skip
     FirstScreen firstScreen = FirstScreen::Panes;         ///< first-screen = panes | overview
     Lists lists = Lists::Rows;                            ///< lists = rows | table
+    CurveCharacters curves = CurveCharacters::Braille;    ///< curves = braille | blocks | ascii
     std::optional<std::string> snapshotDirectory;         ///< snapshot-directory = PATH
     std::optional<std::string> saveButtonMarker;          ///< save-button-marker = PATH
     int systemLogLevel = kSyslogLevel;                    ///< system-log-level = 0 ... 7

@@ -3,8 +3,8 @@
 #include "fields/EventFields.h"
 #include "fields/Measures.h"
 #include "fields/StatusFields.h"
-#include "knowledge/CellIdentity.h"
 #include "knowledge/CountryCodes.h"
+#include "overview/StatusWords.h"
 #include "text/Format.h"
 #include "timeline/EventFinder.h"
 
@@ -36,22 +36,9 @@ std::string trimmed(std::string text) {
     return text;
 }
 
-std::optional<std::uint32_t> wholeNumber(double number) {
-    constexpr double kMost = 4294967295.0;
-    const bool isWhole = number >= 0 && number <= kMost && number == std::trunc(number);
-    return isWhole ? std::optional(static_cast<std::uint32_t>(number)) : std::nullopt;
-}
-
 std::string siteOf(RadioSystem system, const FieldValue& identity) {
-    const auto number = wholeNumber(identity.number);
-    const bool isUmts = system == RadioSystem::UmtsFdd || system == RadioSystem::UtraTdd;
-    if (const auto cell = number && system == RadioSystem::Lte ? lteCell(*number) : std::nullopt) {
-        return formatText("eNodeB %u sector %u", {cell->eNodeB, cell->sector});
-    }
-    if (const auto cell = number && isUmts ? umtsCell(*number) : std::nullopt) {
-        return formatText("RNC %u cell %u", {cell->rnc, cell->cell});
-    }
-    return "cell " + identityText(identity);
+    const std::string words = siteWords(system, identity.number);
+    return words.empty() ? "cell " + identityText(identity) : words;
 }
 
 /// "0" of "800 MHz cellular band [0]".
@@ -93,7 +80,8 @@ public:
 
 private:
     StatusValue valueOf(std::string_view name, std::string_view field, const FieldValue& value) {
-        return {std::string(name), std::string(field), value.text(), value.number, {}, value.read};
+        return {
+            std::string(name), std::string(field), value.text(), value.number, {}, value.read, {}};
     }
     StatusValue identityOf(const StatusField& field, const FieldValue& value) {
         StatusValue identity = valueOf(field.name, field.field, value);
@@ -257,6 +245,7 @@ void Gathering::addList(StatusCell& cell, const StatusCellFields& rule, const St
                                        ? isSame(cell, names)
                                        : value.text().starts_with(list.servingMark);
             StatusValue measured = levelOf(list.levelName, list.level, value);
+            measured.entry = _values.entries().words(entry.entry);
             if (isServing) {
                 const std::size_t mark = list.servingMark.size();
                 measured.text.erase(0, mark + (mark > 0 ? 1 : 0)); // and its blank

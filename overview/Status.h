@@ -24,6 +24,7 @@ struct StatusValue {
     Time read;
     /// A value that was read longer ago is overdue; nothing if it is not known how often it comes.
     std::optional<std::chrono::nanoseconds> patience = {};
+    std::string entry = {}; ///< the words of the list's entry that has the value
 };
 
 inline bool isOverdue(Time now, const StatusValue& value) {

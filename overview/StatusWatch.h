@@ -3,8 +3,10 @@
 #include "monitor/Arrivals.h"
 #include "overview/Status.h"
 #include "packets/StampSequence.h"
+#include "timeline/Curve.h"
 #include "timeline/Event.h"
 #include "timeline/EventFinder.h"
+#include "timeline/LeafField.h"
 #include "timeline/Moment.h"
 
 #include <memory>
@@ -21,6 +23,14 @@ struct Overview {
     Status status;
     std::vector<Event> events;     ///< the latest last
     std::chrono::seconds ahead{0}; ///< local time minus UTC
+    /// The curves of levels over one time.
+    struct LevelCurve {
+        LeafName leaf;
+        Curve curve;
+    };
+    std::vector<LevelCurve> curves = {};
+    Time curvesFrom = {};
+    Time curvesTo = {};
 };
 
 /// What was known at an instant of a timeline.

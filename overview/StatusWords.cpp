@@ -1,6 +1,7 @@
 #include "overview/StatusWords.h"
 
 #include "fields/Measures.h"
+#include "knowledge/CellIdentity.h"
 #include "knowledge/Channels.h"
 #include "text/AgeText.h"
 
@@ -16,6 +17,24 @@ std::string operatorWords(const StatusOperator& network) {
         words.append(network.code->mnc);
     }
     return words.append(network.country.empty() ? "" : " (" + network.country + ")");
+}
+
+std::optional<std::uint32_t> wholeNumber(double number) {
+    constexpr double kMost = 4294967295.0;
+    const bool isWhole = number >= 0 && number <= kMost && number == std::trunc(number);
+    return isWhole ? std::optional(static_cast<std::uint32_t>(number)) : std::nullopt;
+}
+
+std::string siteWords(RadioSystem system, double identity) {
+    const auto number = wholeNumber(identity);
+    const bool isUmts = system == RadioSystem::UmtsFdd || system == RadioSystem::UtraTdd;
+    if (const auto cell = number && system == RadioSystem::Lte ? lteCell(*number) : std::nullopt) {
+        return formatText("eNodeB %u sector %u", {cell->eNodeB, cell->sector});
+    }
+    if (const auto cell = number && isUmts ? umtsCell(*number) : std::nullopt) {
+        return formatText("RNC %u cell %u", {cell->rnc, cell->cell});
+    }
+    return "";
 }
 
 std::vector<std::string> identityWords(const StatusCell& cell) {

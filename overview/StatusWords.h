@@ -1,5 +1,6 @@
 #pragma once
 
+#include "knowledge/Channels.h"
 #include "overview/Status.h"
 
 #include <chrono>
@@ -14,6 +15,10 @@ namespace pallax {
 
 /// "Telekom 262-01 (Germany)".
 std::string operatorWords(const StatusOperator& network);
+/// The parts of a cell's identity: "eNodeB 104470 sector 1"; empty where the system has none.
+std::string siteWords(RadioSystem system, double identity);
+/// The number of a channel or an identity; nothing if it is none.
+std::optional<std::uint32_t> wholeNumber(double number);
 /// "eNodeB 104470 sector 1", "PCI 150", "TAC 6699".
 std::vector<std::string> identityWords(const StatusCell& cell);
 /// "EARFCN 1850", "band 3", "1870.0 MHz"; empty without a channel.

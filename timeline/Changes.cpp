@@ -15,12 +15,6 @@ Entries entriesIn(const CurrentValues& values) {
     return entries;
 }
 
-const FieldValue* valueIn(const EntryValues& entry, FieldIndex field) {
-    const auto found = std::find_if(entry.values.begin(), entry.values.end(),
-                                    [field](const auto& each) { return each.first == field; });
-    return found != entry.values.end() ? &found->second : nullptr;
-}
-
 void addAll(const EntryValues& entry, Change::Kind kind, std::vector<Change>& changes) {
     for (const auto& [field, value] : entry.values) {
         Change change{kind, field, entry.entry, {}, {}};
@@ -31,14 +25,14 @@ void addAll(const EntryValues& entry, Change::Kind kind, std::vector<Change>& ch
 
 void compare(const EntryValues& before, const EntryValues& after, std::vector<Change>& changes) {
     for (const auto& [field, value] : before.values) {
-        const FieldValue* now = valueIn(after, field);
+        const FieldValue* now = after.value(field);
         if (now == nullptr || !(*now == value)) {
             changes.push_back({Change::Kind::Value, field, before.entry, value,
                                now != nullptr ? *now : FieldValue()});
         }
     }
     for (const auto& [field, value] : after.values) {
-        if (valueIn(before, field) == nullptr) {
+        if (before.value(field) == nullptr) {
             changes.push_back({Change::Kind::Value, field, after.entry, {}, value});
         }
     }

@@ -31,6 +31,12 @@ bool isEmptied(const EntryValues& entry, std::size_t held) {
 
 } // namespace
 
+const FieldValue* EntryValues::value(FieldIndex field) const {
+    const auto found = std::find_if(values.begin(), values.end(),
+                                    [field](const auto& each) { return each.first == field; });
+    return found != values.end() ? &found->second : nullptr;
+}
+
 void CurrentValues::clear() {
     _values.clear();
     _lists.clear();
@@ -48,6 +54,44 @@ void CurrentValues::take(const CurrentValues& other) {
 const FieldValue* CurrentValues::value(std::string_view fieldName) const {
     const auto field = _fields->named(fieldName);
     return field ? value(*field) : nullptr;
+}
+
+const CurrentValues::Slot* CurrentValues::slotAt(std::size_t list,
+                                                 std::span<const std::size_t> places) const {
+    const List& searched = _lists[list];
+    const auto outerPlaces = places.first(places.size() - 1);
+    if (outerPlaces.empty() != (searched.outer == kNone)) {
+        return nullptr;
+    }
+    EntryId outer = kNoEntry;
+    if (searched.outer != kNone) {
+        const Slot* const around = slotAt(searched.outer, outerPlaces);
+        if (around == nullptr) {
+            return nullptr;
+        }
+        outer = around->held.entry;
+    }
+    std::size_t place = 0;
+    for (std::size_t index = 0; index < searched.count; ++index) {
+        const Slot& slot = searched.slots[index];
+        if (slot.outer == outer && place++ == places.back()) {
+            return &slot;
+        }
+    }
+    return nullptr;
+}
+
+const EntryValues* CurrentValues::entryAt(FieldIndex field,
+                                          std::span<const std::size_t> places) const {
+    const auto hasField = [field](const Slot& slot) { return slot.held.value(field) != nullptr; };
+    for (std::size_t list = 0; list < _lists.size() && !places.empty(); ++list) {
+        const auto begin = _lists[list].slots.begin();
+        if (std::any_of(begin, begin + static_cast<std::ptrdiff_t>(_lists[list].count), hasField)) {
+            const Slot* const slot = slotAt(list, places);
+            return slot != nullptr ? &slot->held : nullptr;
+        }
+    }
+    return nullptr;
 }
 
 std::size_t CurrentValues::bytes() const {

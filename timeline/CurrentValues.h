@@ -7,6 +7,7 @@
 #include <cmath>
 #include <cstddef>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -31,6 +32,9 @@ struct FieldValue {
 struct EntryValues {
     EntryId entry = kNoEntry;
     std::vector<std::pair<FieldIndex, FieldValue>> values;
+
+    /// Null if the entry has none.
+    const FieldValue* value(FieldIndex field) const;
 };
 
 /// The current values of all fields after a packet: a sink that keeps the latest sample of each
@@ -80,6 +84,9 @@ public:
             }
         }
     }
+    /// The entry at these places in the lists around a field, of lists in lists the outer one
+    /// first. Null if there is none, or if no entry of the list has the field.
+    const EntryValues* entryAt(FieldIndex field, std::span<const std::size_t> places) const;
     std::size_t bytes() const;
 
     void sample(const Sample& sample) override;
@@ -127,6 +134,8 @@ private:
     static constexpr std::size_t kNone = static_cast<std::size_t>(-1);
 
     void store(FieldValue& target, const Sample& sample) const;
+    /// The slot at the last of the places; null if there is none.
+    const Slot* slotAt(std::size_t list, std::span<const std::size_t> places) const;
     void sampleInEntry(Open& open, const Sample& sample);
     /// The place of a list with a layout, so that its name is looked up only once.
     struct Known {

@@ -68,7 +68,7 @@ const std::vector<Layer>& layers() {
         {"travel", {"text", "packets", "timeline", "query"}},
         {"ui/terminal",
          {"text", "plist", "platform", "platform/ui", "app/tree", "app/pane", "app/table", "app",
-          "fields", "timeline", "query", "overview", "travel"}},
+          "knowledge", "fields", "timeline", "query", "overview", "travel"}},
         {"simulator", {"text", "plist", "platform", "packets", "host"}},
         {"sources",
          {"text", "plist", "platform", "packets", records, generators, "host", "simulator"}},

@@ -48,6 +48,11 @@ TEST(Settings, AreReadLineByLine) {
     EXPECT_EQ(settings->alarms[1].condition, "a = 'b = c'");
     EXPECT_EQ(parseSettings("after-reconnect = keep", "pallax.conf")->afterReconnect,
               AfterReconnect::Keep);
+    for (const auto& [word, curves] : {std::pair("braille", CurveCharacters::Braille),
+                                       std::pair("blocks", CurveCharacters::Blocks),
+                                       std::pair("ascii", CurveCharacters::Ascii)}) {
+        EXPECT_EQ(parseSettings(std::string("curves = ") + word, "pallax.conf")->curves, curves);
+    }
     EXPECT_EQ(parseSettings("first-screen = panes", "pallax.conf")->firstScreen,
               FirstScreen::Panes);
     EXPECT_EQ(parseSettings("lists = rows", "pallax.conf")->lists, Lists::Rows);
@@ -63,6 +68,7 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Keep);
     EXPECT_EQ(settings->firstScreen, FirstScreen::Panes);
     EXPECT_EQ(settings->lists, Lists::Rows);
+    EXPECT_EQ(settings->curves, CurveCharacters::Braille);
     EXPECT_EQ(settings->journal.age, std::chrono::hours(24));
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{256} << 20U);
     EXPECT_TRUE(settings->alarms.empty());
@@ -85,6 +91,8 @@ TEST(Settings, AMistakeIsOneSentenceWithFileAndLine) {
               "pallax.conf, line 1: alarm \"a\": This is not a whole condition.");
     EXPECT_EQ(sentenceFor("alarm = a: x\nalarm = b: x\nalarm = a: y"),
               "pallax.conf, line 3: there is already an alarm \"a\".");
+    EXPECT_EQ(sentenceFor("curves = dots"),
+              "pallax.conf, line 1: curves is \"braille\", \"blocks\" or \"ascii\", not \"dots\".");
     EXPECT_EQ(sentenceFor("snapshot-directory ="),
               "pallax.conf, line 1: snapshot-directory needs a path.");
     for (const char* level : {"8", "-1", "4x", "", "warning", "99999999999"}) {

@@ -101,7 +101,7 @@ TEST(ManualPage, TheSettingsPageNamesEverySetting) {
     const std::string page = plain(contentOf(PALLAX_SOURCE_DIR "/docs/man/pallax.conf.5"));
     for (const char* setting : {"on-fatal-record", "snapshot-directory", "save-button-marker",
                                 "system-log-level", "after-reconnect", "first-screen", "lists",
-                                "journal-hours", "journal-mebibytes", "alarm"}) {
+                                "curves", "journal-hours", "journal-mebibytes", "alarm"}) {
         EXPECT_NE(page.find(std::string(".BR ") + setting), std::string::npos) << setting;
     }
 }

@@ -60,7 +60,7 @@ int Bars::drawOrigin(int right, int columns) {
     }
     const int left = right - columnsOf(text);
     _grid.put(left, kTitleRow, text, kSecondary);
-    if (_status.filterEditor == nullptr) { // else the key would be typed
+    if (!_status.prompt) { // else the key would be typed
         _hits.add(left, kTitleRow, columnsOf(text), 1,
                   [press = _status.press] { press(typed(U'o')); });
     }

@@ -17,10 +17,15 @@ constexpr int kScrollColumns = 8; // per key, in a row that does not fit
 
 FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
     : _surroundings(std::move(surroundings)), _marks(marks), _toolkit([this] { needsDisplay(); }),
-      _modalKeys([this] { needsDisplay(); }),
+      _modalKeys([this] { needsDisplay(); },
+                 [this] {
+                     _help.open(HelpPlace::Save);
+                     needsDisplay();
+                 }),
       _time({_surroundings.travel, _toolkit,
              [this](std::string text) { setMessage(std::move(text)); },
-             [this] { needsDisplay(); }}) {
+             [this] { needsDisplay(); }}),
+      _shown(_surroundings.valueSource()) {
     _toolkit.lists().partAt = _surroundings.entryPart;
 }
 
@@ -79,7 +84,9 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .stream = _stream,
                             .alarms = _alarms,
                             .zone = _surroundings.zone(),
-                            .press = [this](const KeyEvent& event) { handle(event); }};
+                            .press = [this](const KeyEvent& event) { handle(event); },
+                            .curve = [this](const std::string& path,
+                                            int columns) { return curveOfRow(path, columns); }};
     if (_pages.isOpen()) {
         _pages.draw({grid, _marks, _hits}, {navigation.screens().front()->title(),
                                             navigation.top().toolbarItems(), status});
@@ -89,7 +96,7 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
 }
 
 void FrontEnd::openOverview() {
-    _pages.open(OverviewPage(_surroundings.overview));
+    _pages.open(OverviewPage([this] { return overviewWithCurves(); }));
     needsDisplay();
 }
 
@@ -228,7 +235,7 @@ void FrontEnd::handlePage(const KeyEvent& event) {
     if (character == U'q' && !navigation()->isAtRoot()) {
         _pages.closeTop();
         needsDisplay();
-    } else if (character == U'q' || character == U'?' || character == U'R') {
+    } else if (character == U'q' || character == U'?' || character == U'R' || character == U'V') {
         handlePaneCharacter(character);
     }
 }
@@ -272,8 +279,7 @@ void FrontEnd::handlePane(const KeyEvent& event) {
     }
     switch (event.key) {
     case Key::Enter:
-        openOrScroll(pane, false);
-        return;
+        return openRow();
     case Key::Right:
         openOrScroll(pane, true);
         return;
@@ -319,6 +325,10 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return openEvents();
     case U';':
         return openQuery();
+    case U'i':
+    case U'v':
+    case U'V':
+        return handleValueKey(character);
     case U's':
         return save();
     case U'y':

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "timeline/Moment.h"
+#include "ui/terminal/Graph.h"
 #include "ui/terminal/Grid.h"
 #include "ui/terminal/HelpPage.h"
 #include "ui/terminal/HitMap.h"
@@ -10,6 +11,7 @@
 #include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/Origin.h"
 #include "ui/terminal/Pages.h"
+#include "ui/terminal/ShownValues.h"
 #include "ui/terminal/TerminalToolkit.h"
 #include "ui/terminal/TimeControl.h"
 
@@ -41,8 +43,15 @@ public:
         std::function<Overview()> overview = [] { return Overview(); };
         /// The part of a field in telling entries of its list apart.
         EntryPartAt entryPart = ListLook().partAt;
-        /// The instant that is shown.
+        /// The shown instant of the timeline, if there is one.
         std::function<Moment()> moment = [] { return Moment(); };
+        /// The current values while there is no timeline; null if there are none.
+        std::function<const CurrentValues*()> values = [] { return nullptr; };
+        std::function<const NetworkNames&()> names = []() -> const NetworkNames& {
+            static const NetworkNames none;
+            return none;
+        };
+        std::function<DisplayTime()> time = [] { return DisplayTime(); };
         /// Shows the instant of a packet.
         std::function<void(std::uint64_t packet)> goTo = [](std::uint64_t /*packet*/) {};
         /// Asked often during long work, such as a query; false stops it.
@@ -52,6 +61,8 @@ public:
         std::function<std::chrono::seconds()> ahead = [] { return std::chrono::seconds(0); };
         /// Goes back in time; null if there is only the present. Must outlive the front end.
         Travel* travel = nullptr;
+
+        ShownValues::Source valueSource() const;
     };
 
     FrontEnd(Surroundings surroundings, const Marks& marks);
@@ -107,6 +118,13 @@ private:
     void handlePaneCharacter(char32_t character);
     bool moveCursor(TerminalTable& table, const KeyEvent& event);
     void openOrScroll(TerminalTable& table, bool mayScroll);
+    void openRow();
+    std::optional<PaneLeaf> leafAtCursor() const;
+    void openValue(PaneLeaf leaf);
+    void openGraph();
+    void handleValueKey(char32_t character);
+    std::string curveOfRow(const std::string& path, int columns);
+    Overview overviewWithCurves();
     void goBack(TerminalTable& table);
     void escape(TerminalTable& table);
     void save();
@@ -125,6 +143,8 @@ private:
     ModalKeys _modalKeys;
     mutable TimeControl _time;
     HelpPage _help;
+    ShownValues _shown;
+    Graph _graph;
     Pages _pages;
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
     std::weak_ptr<ui::TableScreen> _filteredPane; ///< the pane of the filter

@@ -5,6 +5,9 @@
 
 namespace pallax::terminal {
 
+/// What curves are drawn with.
+enum class Curves { Braille, Blocks, Ascii };
+
 /// The marks drawn next to texts and between them, each one column wide.
 struct Marks {
     bool asciiOnly;
@@ -32,18 +35,45 @@ struct Marks {
     std::string_view bottomLeft;
     std::string_view bottomRight;
     std::array<std::string_view, 4> spinner;
+    std::string_view tick;  ///< beside a label of a vertical axis
+    std::string_view event; ///< a vertical line where something happened
+    Curves curves;
 };
 
-inline constexpr Marks kUtf8Marks{false, "▌", "›", "*",   "o",
-                                  "…",   "↑", "↓", " › ", " · ",
-                                  "▆",   "▁", "▕", "▏",   "●",
-                                  "◆",   "┴", "✓", "─",   "│",
-                                  "┌",   "┐", "└", "┘",   {"⠋", "⠹", "⠴", "⠧"}};
+inline constexpr Marks kUtf8Marks{false,
+                                  "▌",
+                                  "›",
+                                  "*",
+                                  "o",
+                                  "…",
+                                  "↑",
+                                  "↓",
+                                  " › ",
+                                  " · ",
+                                  "▆",
+                                  "▁",
+                                  "▕",
+                                  "▏",
+                                  "●",
+                                  "◆",
+                                  "┴",
+                                  "✓",
+                                  "─",
+                                  "│",
+                                  "┌",
+                                  "┐",
+                                  "└",
+                                  "┘",
+                                  {"⠋", "⠹", "⠴", "⠧"},
+                                  "┤",
+                                  "┆",
+                                  Curves::Braille};
 
-inline constexpr Marks kAsciiMarks{true, ">", ">", "*",   "o",
-                                   "~",  "^", "v", " > ", ", ",
-                                   "#",  ".", "[", "]",   "o",
-                                   "m",  "'", "x", "-",   "|",
-                                   "+",  "+", "+", "+",   {"|", "/", "-", "\\"}};
+inline constexpr Marks kAsciiMarks{true, ">", ">",          "*",   "o",
+                                   "~",  "^", "v",          " > ", ", ",
+                                   "#",  ".", "[",          "]",   "o",
+                                   "m",  "'", "x",          "-",   "|",
+                                   "+",  "+", "+",          "+",   {"|", "/", "-", "\\"},
+                                   "+",  ":", Curves::Ascii};
 
 } // namespace pallax::terminal

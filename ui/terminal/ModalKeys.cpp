@@ -42,6 +42,8 @@ void ModalKeys::handleButtons(ui::ModalScreen& screen, const KeyEvent& event) {
     const bool isSave = _focus == ModalFocus::Save;
     if (event.key == Key::Enter || (event.key == Key::Character && event.character == U' ')) {
         isSave ? screen.savePressed() : screen.cancelPressed();
+    } else if (event.key == Key::Character && event.character == U'?') {
+        _openHelp();
     } else if ((goesForwards(event) && !isSave) || (goesBackwards(event) && isSave)) {
         terminalTextField(screen.field()).beginEditing();
     } else if (goesForwards(event) || goesBackwards(event) || event.key == Key::Left ||

@@ -11,8 +11,8 @@ namespace pallax::terminal {
 /// The keys of a modal screen: of its list, its text field and its buttons.
 class ModalKeys {
 public:
-    explicit ModalKeys(std::function<void()> needsDisplay)
-        : _needsDisplay(std::move(needsDisplay)) {}
+    ModalKeys(std::function<void()> needsDisplay, std::function<void()> openHelp)
+        : _needsDisplay(std::move(needsDisplay)), _openHelp(std::move(openHelp)) {}
 
     ModalFocus focus() const { return _focus; }
     /// For the next screen to be opened.
@@ -23,6 +23,7 @@ private:
     void handleButtons(ui::ModalScreen& screen, const KeyEvent& event);
 
     std::function<void()> _needsDisplay;
+    std::function<void()> _openHelp;
     ModalFocus _focus = ModalFocus::Save;
 };
 

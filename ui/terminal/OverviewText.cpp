@@ -2,6 +2,7 @@
 
 #include "overview/StatusWords.h"
 #include "ui/terminal/EventText.h"
+#include "ui/terminal/Plot.h"
 #include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
@@ -58,6 +59,7 @@ private:
     std::vector<TextRow> table(std::vector<std::vector<TableText>> rows) const;
     std::vector<TableText> levelCells(std::string name, const StatusValue& level) const;
     std::string bar(const StatusValue& level) const;
+    std::string curve(const StatusValue& level) const;
 
     const Overview& _overview;
     const Status& _status;
@@ -129,6 +131,17 @@ std::string Blocks::bar(const StatusValue& level) const {
     return text;
 }
 
+std::string Blocks::curve(const StatusValue& level) const {
+    constexpr int kCurveColumns = 24;
+    for (const Overview::LevelCurve& each : _overview.curves) {
+        if (each.leaf.field == level.field && each.leaf.entry == level.entry) {
+            return sparkline(_marks, each.curve, _overview.curvesFrom, _overview.curvesTo,
+                             kCurveColumns);
+        }
+    }
+    return "";
+}
+
 /// Name, level, quality and bar.
 std::vector<TableText> Blocks::levelCells(std::string name, const StatusValue& level) const {
     const Style style = isOverdue(_status.time, level) ? kPale : Style();
@@ -180,6 +193,7 @@ Block Blocks::levels() const {
         for (const StatusValue& level : cell.levels) {
             rows.push_back(levelCells(systemOf(cell.system) + level.name, level));
             rows.back().push_back({oldAgeWords(_status.time, {&level}), kPale});
+            rows.back().push_back({curve(level)});
             isGraded = isGraded || level.grade;
         }
     }

@@ -1,6 +1,6 @@
 #include "ui/terminal/Page.h"
 
-#include "ui/terminal/TextWidth.h"
+#include "ui/terminal/PageTitle.h"
 
 #include <string>
 
@@ -10,10 +10,8 @@ PageFrame::PageFrame(const PageScreen& screen, const PageSurroundings& around,
                      std::string_view title)
     : _screen(screen), _around(around) {
     Bars bars(screen.grid, screen.marks, screen.hits, around.status);
-    const int end = screen.grid.columns() - kMargin;
-    const std::string way = std::string(around.root).append(screen.marks.crumb).append(title);
-    const int room = bars.drawOrigin(end, end - kMargin - columnsOf(way) - kGap);
-    screen.grid.put(kMargin, kTitleRow, way, {.bold = true}, {kMargin, room});
+    drawPageTitle(screen.grid, screen.marks, bars,
+                  std::string(around.root).append(screen.marks.crumb).append(title));
 }
 
 void PageFrame::finish(const Scrolling& scrolling, int lines,

@@ -122,14 +122,13 @@ void PageTable::drawLastRow(const PageScreen& screen, const PageSurroundings& ar
         status.message = words.message;
     }
     Bars last(screen.grid, screen.marks, screen.hits, status);
-    const int end = last.drawStatus(around.items, ruleRight);
     std::vector<Hint> hints = words.hints;
     if (!model().content().rows.empty()) {
         hints.push_back({"< > sort", typed(U'>')});
         hints.push_back({"/ filter", typed(U'/')});
     }
     hints.push_back({"? help", typed(U'?')});
-    last.drawHints(hints, end);
+    last.drawLastRow(around.items, ruleRight, hints);
 }
 
 } // namespace pallax::terminal

@@ -2,8 +2,10 @@
 
 #include "ui/terminal/ChangesPage.h"
 #include "ui/terminal/EventsPage.h"
+#include "ui/terminal/GraphPage.h"
 #include "ui/terminal/OverviewPage.h"
 #include "ui/terminal/QueryPage.h"
+#include "ui/terminal/ValuePage.h"
 
 #include <utility>
 #include <variant>
@@ -11,7 +13,7 @@
 
 namespace pallax::terminal {
 
-using Page = std::variant<OverviewPage, ChangesPage, EventsPage, QueryPage>;
+using Page = std::variant<OverviewPage, ChangesPage, EventsPage, QueryPage, ValuePage, GraphPage>;
 
 /// The pages over the panes, the last one on top. They are not on the navigation stack, whose panes
 /// are updated meanwhile.

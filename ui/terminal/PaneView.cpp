@@ -13,6 +13,7 @@ namespace pallax::terminal {
 
 namespace {
 
+constexpr int kLeastColumnsForCurves = 100; // on a narrower screen rows have only name and value
 constexpr Style kBold{.bold = true};
 constexpr Style kDim{.dim = true};
 
@@ -86,7 +87,7 @@ void PaneView::draw(TerminalNavigation& navigation, const PaneStatus& status) {
         list->draw(_grid, _marks, _hits, kRowsAbove,
                    [&source = table.source()](std::size_t row) { source.didSelectRow(row); });
     } else {
-        drawRows(table);
+        drawRows(table, status);
     }
     drawUpperRule(table, bars, status);
     const int ruleRight =
@@ -159,24 +160,27 @@ void PaneView::drawGone(const TerminalTable& table, int y, int right) {
     }
 }
 
-void PaneView::drawRows(TerminalTable& table) {
+void PaneView::drawRows(TerminalTable& table, const PaneStatus& status) {
     const int end = _grid.rows() - kRowsBelow;
     if (const std::string why = table.pane().emptyWords(); !why.empty() && end > kRowsAbove) {
         _grid.put(kMargin, kRowsAbove, why, kDim, {kMargin, _grid.columns() - kMargin});
     }
     std::size_t shown = table.firstShown();
     for (int y = kRowsAbove; y < end && shown < table.pane().shownRows(); ++y, ++shown) {
-        drawRow(table, shown, y);
+        drawRow(table, shown, y, status);
     }
 }
 
-void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y) {
+void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y, const PaneStatus& status) {
     const PaneModel& pane = table.pane();
     const std::size_t index = pane.rowAt(shown);
     const std::shared_ptr<ui::TableCell> cell = table.source().cellForRow(index);
     const PaneRow row = pane.row(index);
     const bool isSelected = shown == pane.cursor();
     drawCell(table, *cell, row, y, isSelected);
+    if (row.number && _grid.columns() >= kLeastColumnsForCurves) {
+        drawCurve(cell->contents(), status, childPath(pane.path(), row.name), y);
+    }
     if (isSelected) {
         _grid.put(0, y, _marks.cursor, {.accent = true});
     }
@@ -238,6 +242,20 @@ void PaneView::drawAge(std::chrono::nanoseconds age, int y, Span room, int markC
         _grid.put(left, y, text, kDim);
     } else {
         _grid.put(markColumn, y, _marks.old, kDim);
+    }
+}
+
+/// In the same columns of each row, where name and value leave room.
+void PaneView::drawCurve(const ui::CellContents& contents, const PaneStatus& status,
+                         const std::string& path, int y) {
+    constexpr int kCurveColumns = 24;
+    constexpr int kValueColumns = 20; // of the usual values, with the margin
+    const int right = _grid.columns() - kValueColumns;
+    const ui::Label& name = *contents.labels.front();
+    const ui::Label& value = *contents.labels.back();
+    const int end = columnOf(name.frame.origin.x) + columnsOf(name.text);
+    if (end + kGap <= right - kCurveColumns && columnOf(value.frame.origin.x) >= right + kGap) {
+        _grid.put(right - kCurveColumns, y, status.curve(path, kCurveColumns), kDim);
     }
 }
 

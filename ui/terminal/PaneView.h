@@ -24,8 +24,10 @@ private:
     void drawBreadcrumbs(TerminalNavigation& navigation, int right);
     void drawUpperRule(TerminalTable& table, Bars& bars, const PaneStatus& status);
     void drawGone(const TerminalTable& table, int y, int right);
-    void drawRows(TerminalTable& table);
-    void drawRow(TerminalTable& table, std::size_t shown, int y);
+    void drawRows(TerminalTable& table, const PaneStatus& status);
+    void drawRow(TerminalTable& table, std::size_t shown, int y, const PaneStatus& status);
+    void drawCurve(const ui::CellContents& contents, const PaneStatus& status,
+                   const std::string& path, int y);
     void drawCell(const TerminalTable& table, ui::TableCell& cell, const PaneRow& row, int y,
                   bool isSelected);
     void drawAge(std::chrono::nanoseconds age, int y, Span room, int markColumn);

@@ -111,6 +111,9 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ < > r  x X        sort a table; hide columns    │
 │ o                 overview of the radio         │
 │ e ;               events; ask in SQL            │
+│ i Enter           all about the value           │
+│ v V               put it in the graph; open it  │
+│ + -  Left Right   zoom and read a curve         │
 │ Space             hold time; play on from there │
 │ , .               one tick back or forward      │
 │ [ ]               to the event before or after  │

@@ -118,7 +118,7 @@ TEST_F(PaneViewOriginTest, AlarmsStandInTheTitleAsLongAsTheyHold) {
     stage.frontEnd.setStream("");
     stage.frontEnd.setAlarms({"weak signal"});
     stage.frontEnd.resize(30, 8);
-    EXPECT_EQ(stage.line(0), " Pallax › Over  ! weak signal");
+    EXPECT_EQ(stage.line(0), " …x › Overview  ! weak signal");
     stage.frontEnd.setAlarms({});
     EXPECT_EQ(stage.line(0), " Pallax › Overview");
 }

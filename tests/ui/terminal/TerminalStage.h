@@ -32,6 +32,9 @@ public:
                     [this] { return overview; },
                     [this](const std::string& path) { return entryPart(path); },
                     [this] { return moment; },
+                    [this] { return values; },
+                    [this]() -> const NetworkNames& { return names; },
+                    [this] { return displayTime; },
                     [this](std::uint64_t packet) { went.push_back(packet); },
                     [this] { return mayGoOn(); },
                     {[this] { return earlier; },
@@ -58,6 +61,9 @@ public:
     Overview overview; ///< what the overview shows
     EntryPartAt entryPart = ListLook().partAt;
     Moment moment;
+    const CurrentValues* values = nullptr; ///< without a timeline
+    NetworkNames names;
+    DisplayTime displayTime;
     std::vector<std::uint64_t> went;
     std::chrono::seconds ahead{0};
     std::function<bool()> mayGoOn = [] { return true; };
