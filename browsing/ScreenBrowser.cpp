@@ -48,7 +48,11 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                              needsDisplay();
                          }
                      },
-                 .replaced = [this] { _travel.reset(); }}),
+                 .replaced =
+                     [this] {
+                         _travel.reset();
+                         _frontEnd.forgetTimeline();
+                     }}),
       _travel(travelSurroundings()),
       _alarms({settings.alarms, knowledge(),
                [this](const auto& text) {

@@ -22,7 +22,7 @@ using doubles::runCommand;
 
 /// The page's text without roff markup.
 std::string plain(const std::string& page) {
-    return replaced(replaced(page, R"(\\f[BIR])", ""), R"(\\-)", "-");
+    return replaced(replaced(replaced(page, R"(\\f[BIR])", ""), R"(\\-)", "-"), R"(\\\(ha)", "^");
 }
 
 CommandDescription program() {

@@ -82,6 +82,9 @@ public:
     /// Whether lists open as tables, until the user chooses otherwise.
     void showListsAsTables(bool asTables) { _toolkit.lists().asTables = asTables; }
 
+    /// The timeline is another one: what is known of the old one is forgotten.
+    void forgetTimeline() { _shown.forget(); }
+
     /// Replaces the status text until the next key.
     void setMessage(std::string message);
     /// Sets a few words after the status text.

@@ -12,18 +12,24 @@ std::string keyOfLeaf(const LeafName& leaf) {
 
 } // namespace
 
+void ShownValues::forget() {
+    _moment = {};
+    _values = nullptr;
+    _earlier.reset();
+    _isChosen = false;
+    _readings.clear();
+    _curves.clear();
+}
+
 void ShownValues::update() {
     const Moment moment = _source.moment();
     _time = _source.time();
     Timeline* const timeline = moment.timeline;
     const bool isSame = timeline == _moment.timeline && moment.instant == _moment.instant;
-    _moment = moment;
     if (!isSame) {
-        _earlier.reset();
-        _isChosen = false;
-        _readings.clear();
-        _curves.clear();
+        forget();
     }
+    _moment = moment;
     if (timeline == nullptr) {
         _values = _source.values();
     } else if (moment.instant >= timeline->packets()) {

@@ -39,6 +39,8 @@ public:
     /// Turns to the instant that is shown now. The results of the other functions are valid until
     /// the next call.
     void update();
+    /// The timeline is another one.
+    void forget();
     bool hasTimeline() const { return _moment.timeline != nullptr; }
     const CurrentValues* values() const { return _values; }
     const NetworkNames& names() const { return _source.names(); }
