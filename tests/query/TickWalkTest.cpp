@@ -13,7 +13,7 @@ INSTANTIATE_TEST_SUITE_P(All, TickWalkTest, testing::ValuesIn(technologyNames())
 
 TEST_P(TickWalkTest, GoesOnFromWhereItWasAskedForLast) {
     TimelineFixture fixture(GetParam());
-    fixture.drive(5, std::chrono::minutes(6));
+    fixture.drive(5, std::chrono::minutes(6), 10);
     // One key frame, so that no nearer one is taken.
     const auto timeline = fixture.indexed(TimelineFixture::closeKeyFrames(100'000));
     Database database;
