@@ -119,7 +119,7 @@ ValueFacts factsOf(const CurrentValues& values, const FieldInfo& field, const Le
         facts.text = value->value.text();
         facts.knowledge = knowledgeOf(values, field, value->value, names);
         if (borders != profile.borders.end() && std::isfinite(value->value.number)) {
-            facts.grade = nameOf(borders->second.gradeOf(value->value.number));
+            facts.grade = borders->second.gradeOf(value->value.number);
         }
     }
     if (field.least && field.most) {

@@ -13,10 +13,10 @@ namespace pallax {
 
 /// What can be said about one value of the display.
 struct ValueFacts {
-    std::string text;    ///< "-92.25 dBm"; empty if there is no value now
-    std::string grade;   ///< "fair"; empty if the profile does not judge the field
-    std::string borders; ///< "android: poor -115, fair -105, good -95, excellent -85"
-    std::string meaning; ///< a sentence
+    std::string text;           ///< "-92.25 dBm"; empty if there is no value now
+    std::optional<Grade> grade; ///< nothing if the profile does not judge the field
+    std::string borders;        ///< "android: poor -115, fair -105, good -95, excellent -85"
+    std::string meaning;        ///< a sentence
     std::vector<std::string> knowledge; ///< "band 3", "downlink 1870.0 MHz"
     std::string range; ///< "-180 to -52.25"; empty if the layout does not limit the number
     std::vector<std::string> origin; ///< "raw 191 x 0.25 - 140", "log code 0xB17F"

@@ -131,6 +131,40 @@ TEST_F(EndToEndTerminal, ColoursFollowOptionAndEnvironment) {
     EXPECT_FALSE(hasColours({"--color=never"}, "xterm-256color", {}));
 }
 
+TEST_F(EndToEndTerminal, QualityHasTheColoursThatTheTerminalHas) {
+    // The type of a terminal that is told red, green and blue; the system may lack one.
+    std::ofstream(world.path("direct.src"))
+        << "pallax-direct|for a test, RGB, colors#0x1000000, pairs#0x7FFF, "
+           "setaf=\\E[%?%p1%{8}%<%t3%p1%d%e38\\:2\\:%p1%{65536}%/%d\\:"
+           "%p1%{256}%/%{255}%&%d\\:%p1%{255}%&%d%;m, use=xterm-256color,\n";
+    ASSERT_EQ(std::system(
+                  ("tic -x -o " + world.path("terminfo") + " " + world.path("direct.src")).c_str()),
+              0);
+    const auto colors = [this](const std::string& type, std::vector<std::string> options,
+                               const std::string& variable) {
+        world.environment = {"TERMINFO=" + world.path("terminfo"), variable};
+        options.insert(options.begin(), {lteDrive(), "--speed", "max"});
+        PallaxTerminal terminal(world, options, {.type = type});
+        EXPECT_TRUE(terminal.shows("End of the recording"));
+        terminal.type("o");
+        EXPECT_TRUE(terminal.shows("RSRQ   -12.62 dB  good"));
+        (void)terminal.settled();
+        const std::string found = terminal.screen().colorOf("excellent") + " " +
+                                  terminal.screen().colorOf("good") + " " +
+                                  terminal.screen().colorOf("-12.62 dB");
+        EXPECT_EQ(terminal.screen().unknown(), "") << type;
+        terminal.type("q");
+        EXPECT_EQ(terminal.wait(), 0);
+        return found;
+    };
+    EXPECT_EQ(colors("xterm-256color", {}, "NO_COLOR="), "29 32 default");
+    EXPECT_EQ(colors("xterm", {}, "NO_COLOR="), "2 6 default");
+    EXPECT_EQ(colors("pallax-direct", {}, "NO_COLOR="), "#00875f #0087d7 default");
+    EXPECT_EQ(colors("vt100", {}, "NO_COLOR="), "default default default");
+    EXPECT_EQ(colors("xterm-256color", {}, "NO_COLOR=1"), "default default default");
+    EXPECT_EQ(colors("xterm-256color", {"--color=never"}, "NO_COLOR="), "default default default");
+}
+
 TEST_F(EndToEndTerminal, ALocaleThatIsNotUtf8GetsAsciiMarks) {
     PallaxTerminal terminal(world, {brief(), "--speed", "max"}, {.locale = "C"});
     ASSERT_TRUE(terminal.shows(">Serving PLMN"));

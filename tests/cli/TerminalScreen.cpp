@@ -1,5 +1,9 @@
 #include "tests/cli/TerminalScreen.h"
 
+#include "text/Format.h"
+
+#include <vector>
+
 namespace pallax::doubles {
 
 namespace {
@@ -9,6 +13,16 @@ constexpr char kTitleStack = 't';
 
 std::string& unknownOf(void* unknown) {
     return *static_cast<std::string*>(unknown);
+}
+
+std::string nameOf(const VTermColor& color) {
+    if (VTERM_COLOR_IS_DEFAULT_FG(&color)) {
+        return "default";
+    }
+    if (VTERM_COLOR_IS_INDEXED(&color)) {
+        return std::to_string(color.indexed.idx);
+    }
+    return formatText("#%06x", {color.rgb.red << 16 | color.rgb.green << 8 | color.rgb.blue});
 }
 
 int switchScreen(VTermProp property, VTermValue* value, void* isOnOtherScreen) {
@@ -96,6 +110,27 @@ std::string TerminalScreen::text() const {
         text += line + "\n";
     }
     return text;
+}
+
+std::string TerminalScreen::colorOf(const std::string& text) const {
+    int rows = 0;
+    int columns = 0;
+    vterm_get_size(_terminal.get(), &rows, &columns);
+    for (int row = 0; row < rows; ++row) {
+        std::string line;
+        std::vector<VTermColor> colors;
+        for (int column = 0; column < columns; ++column) {
+            VTermScreenCell cell{};
+            (void)vterm_screen_get_cell(_screen, {row, column}, &cell);
+            line += cell.chars[0] < 0x80 ? static_cast<char>(cell.chars[0]) : '?';
+            colors.push_back(cell.fg);
+        }
+        const std::size_t at = line.find(text);
+        if (at != std::string::npos) {
+            return nameOf(colors[at]);
+        }
+    }
+    return "";
 }
 
 void TerminalScreen::resize(int columns, int rows) {

@@ -17,6 +17,9 @@ public:
     void write(std::string_view bytes);
     /// The rows without trailing blanks, each with a line end.
     std::string text() const;
+    /// The colour in which the first occurrence of a text begins: "default", the number of a
+    /// palette's colour, or "#0087d7"; "" if the screen lacks the text. Of ASCII only.
+    std::string colorOf(const std::string& text) const;
     bool isOnOtherScreen() const { return _isOnOtherScreen; }
     /// The escape and control sequences that the terminal did not understand.
     const std::string& unknown() const { return _unknown; }

@@ -63,8 +63,7 @@ TEST(ValueFacts, TellWhereANumberWasRead) {
     EXPECT_EQ(facts.meaning,
               "Reference signal received power of the serving cell, as last measured.");
     EXPECT_EQ(facts.borders, "android: poor -128, fair -118, good -108, excellent -98");
-    EXPECT_EQ(facts.grade,
-              nameOf(*builtInProfile("android")->gradeOf(Measure::Rsrp, value.number)));
+    EXPECT_EQ(facts.grade, builtInProfile("android")->gradeOf(Measure::Rsrp, value.number));
     EXPECT_EQ(facts.range, "-140 to -12.25");
     ASSERT_EQ(facts.origin.size(), 4U);
     EXPECT_EQ(facts.origin[0], "raw " + std::to_string(*value.raw) + " x 0.25 - 140");
@@ -82,7 +81,7 @@ TEST(ValueFacts, WithoutAReadingTheyHaveOnlyTheLogCodes) {
     ASSERT_EQ(facts.origin.size(), 2U);
     EXPECT_EQ(facts.origin[0], "raw " + facts.text);
     EXPECT_EQ(facts.origin[1], "log code 0xB17F");
-    EXPECT_EQ(facts.grade, "");
+    EXPECT_EQ(facts.grade, std::nullopt);
     EXPECT_EQ(facts.borders, "");
 }
 
@@ -91,7 +90,7 @@ TEST(ValueFacts, OfAValueThatIsGoneSayWhatTheFieldMeans) {
     const ValueFacts facts =
         lte.of({"lte.neighbor_cells_list.measured_rsrp", "Physical Cell ID 9999", ""});
     EXPECT_EQ(facts.text, "");
-    EXPECT_EQ(facts.grade, "");
+    EXPECT_EQ(facts.grade, std::nullopt);
     EXPECT_NE(facts.borders, "");
     EXPECT_NE(facts.meaning, "");
     EXPECT_EQ(facts.origin.size(), 1U);

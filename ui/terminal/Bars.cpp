@@ -158,7 +158,7 @@ int Bars::drawTimeBar(const TimeBar& bar) {
         }
     }
     if (bar.marked) {
-        _grid.put(columnOfPlace(*bar.marked), y, _marks.timeMark);
+        _grid.put(columnOfPlace(*bar.marked), y, _marks.timeMark, {.tint = Tint::Purple});
     }
     _grid.put(columnOfPlace(bar.shown), y, _marks.timeShown, {.accent = true});
     for (int place = 0; place < length; ++place) {

@@ -6,6 +6,7 @@
 #include "ui/terminal/CursesCapability.h"
 #include "ui/terminal/CursesKeys.h"
 #include "ui/terminal/TerminalRestorer.h"
+#include "ui/terminal/Tints.h"
 
 #include <array>
 #include <clocale>
@@ -125,6 +126,7 @@ struct CursesTerminal::Impl {
     OwnedFile input;
     SCREEN* screen = nullptr;
     bool hasAccentColor = false;
+    std::array<short, kTints> tintPairs{}; ///< 0, the default colours, where a tint has none
     bool isUtf8 = false;
     std::unique_ptr<TerminalRestorer> restorer;
 
@@ -137,9 +139,29 @@ struct CursesTerminal::Impl {
         return attributes;
     }
 
+    /// Colours on the terminal's own background.
+    void startColors() {
+        ::use_default_colors();
+        hasAccentColor = ::init_pair(kAccentPair, COLOR_CYAN, -1) == OK;
+        for (std::size_t tint = 1; tint < kTints; ++tint) {
+            const auto pair = static_cast<short>(kAccentPair + tint);
+            const auto color = colorOf(static_cast<Tint>(tint), COLORS);
+            if (color && ::init_extended_pair(pair, *color, -1) == OK) {
+                tintPairs.at(tint) = pair;
+            }
+        }
+    }
+
+    short pairOf(Style style) const {
+        if (style.accent) {
+            return hasAccentColor ? kAccentPair : short{0};
+        }
+        return tintPairs.at(static_cast<std::size_t>(style.tint));
+    }
+
     void showCell(const Grid::Cell& cell, int x, int y) const {
         const auto text = wideText(cell.text, !isUtf8);
-        const short pair = cell.style.accent && hasAccentColor ? kAccentPair : 0;
+        const short pair = pairOf(cell.style);
         cchar_t character{};
         ::setcchar(&character, text.data(), attributesOf(cell.style), pair, nullptr);
         ::mvadd_wch(y, x, &character);
@@ -182,8 +204,7 @@ CursesTerminal::open(const Options& options) {
         ::set_escdelay(kEscapeDelay);
     }
     if (wantsColor(options.color) && ::has_colors() && ::start_color() == OK) {
-        ::use_default_colors();
-        impl->hasAccentColor = ::init_pair(kAccentPair, COLOR_CYAN, -1) == OK;
+        impl->startColors();
     }
     if (options.mouse) {
         ::mousemask(BUTTON1_PRESSED | BUTTON4_PRESSED | BUTTON5_PRESSED, nullptr);

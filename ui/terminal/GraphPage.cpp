@@ -4,6 +4,7 @@
 #include "ui/terminal/EventText.h"
 #include "ui/terminal/PageTitle.h"
 #include "ui/terminal/TextWidth.h"
+#include "ui/terminal/Tints.h"
 
 #include <algorithm>
 
@@ -45,15 +46,16 @@ std::vector<GraphPage::Group> GraphPage::groups(int columns) {
     const CurveWindow window = _shown.choose(_keys.span());
     const CurrentValues* values = _shown.values();
     std::vector<Group> groups;
-    char mark = 'a';
+    std::size_t shown = 0;
     for (const LeafName& leaf : _graph.leaves()) {
         const auto index = values != nullptr ? values->fields().named(leaf.field) : std::nullopt;
         if (!index) {
             continue; // of another technology
         }
         const FieldInfo& field = values->fields()[*index];
-        PlotCurve curve{std::string(1, mark++),
-                        _shown.curve(leaf, static_cast<std::size_t>(columns))};
+        PlotCurve curve{std::string(1, static_cast<char>('a' + shown)),
+                        _shown.curve(leaf, static_cast<std::size_t>(columns)), tintOfCurve(shown)};
+        ++shown;
         auto group = std::find_if(groups.begin(), groups.end(), [&field](const Group& each) {
             return each.plot.unit == field.unit;
         });
@@ -112,10 +114,10 @@ void GraphPage::drawGroups(const PageScreen& screen, std::vector<Group> groups) 
     const int rows = (end - kRowsAbove - legends) / static_cast<int>(groups.size());
     int y = kRowsAbove;
     for (Group& group : groups) {
-        for (const std::string& line : group.legend) {
-            if (y < end) {
-                grid.put(kMargin, y++, line, {}, room);
-            }
+        for (std::size_t index = 0; index < group.legend.size() && y < end; ++index, ++y) {
+            const PlotCurve& curve = group.plot.curves[index];
+            grid.put(kMargin, y, group.legend[index], {}, room);
+            grid.put(kMargin, y, curve.mark, {.tint = curve.tint}, room);
         }
         const int height = std::min(std::max(rows, kLeastPlotRows), end - y);
         if (hasCurves && height >= kLeastPlotRows) {

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cstddef>
+#include <cstdint>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -7,12 +9,17 @@
 
 namespace pallax::terminal {
 
+/// A colour that repeats what a text says: nothing is said by colour alone.
+enum class Tint : std::uint8_t { None, Green, Blue, Orange, Red, Purple, Violet };
+inline constexpr std::size_t kTints = 7;
+
 /// The emphasis of a text. A terminal shows it as well as it can.
 struct Style {
     bool bold = false;
     bool dim = false;
     bool underline = false;
-    bool accent = false; ///< the one accent colour, for the current row
+    bool accent = false; ///< the one accent colour, for the current row; above a tint
+    Tint tint = Tint::None;
     bool operator==(const Style&) const = default;
 };
 

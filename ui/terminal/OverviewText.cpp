@@ -4,6 +4,7 @@
 #include "ui/terminal/EventText.h"
 #include "ui/terminal/Plot.h"
 #include "ui/terminal/TextWidth.h"
+#include "ui/terminal/Tints.h"
 
 #include <algorithm>
 #include <cmath>
@@ -145,10 +146,11 @@ std::string Blocks::curve(const StatusValue& level) const {
 /// Name, level, quality and bar.
 std::vector<TableText> Blocks::levelCells(std::string name, const StatusValue& level) const {
     const Style style = isOverdue(_status.time, level) ? kPale : Style();
+    const Style quality = level.grade && !style.dim ? Style{.tint = tintOf(*level.grade)} : style;
     return {{std::move(name)},
             {level.text, style, true},
-            {std::string(qualityWord(level)), style},
-            {bar(level), style}};
+            {std::string(qualityWord(level)), quality},
+            {bar(level), quality}};
 }
 
 Block Blocks::network() const {

@@ -141,20 +141,38 @@ private:
     }
 
     void drawCurves() {
-        for (const PlotCurve& each : _plot.curves) {
-            _curves.draw(each.curve);
-        }
+        const std::vector<std::optional<Tint>> tints = drawDots();
         const int cursor = _plot.cursor ? columnAt(*_plot.cursor) - _left : -1;
         for (int row = 0; row < _rows; ++row) {
             for (int column = 0; column < _columns; ++column) {
                 const std::string text = _dots.textAt(column, row);
                 if (!text.empty()) {
+                    const Style style{.tint = *tints[cellAt(column, row)]};
                     _grid.put(_left + column, _area.y + row, text,
-                              column == cursor ? kCursorColumn : Style{});
+                              column == cursor ? kCursorColumn : style);
                 }
             }
         }
         drawMarks();
+    }
+
+    std::size_t cellAt(int column, int row) const {
+        return static_cast<std::size_t>(row * _columns + column);
+    }
+
+    /// Returns the tint of each cell that has dots: that of the first curve in it.
+    std::vector<std::optional<Tint>> drawDots() {
+        std::vector<std::optional<Tint>> first(cellAt(0, _rows));
+        for (const PlotCurve& each : _plot.curves) {
+            _curves.draw(each.curve);
+            for (int row = 0; row < _rows; ++row) {
+                for (int column = 0; column < _columns; ++column) {
+                    std::optional<Tint>& tint = first[cellAt(column, row)];
+                    tint = !tint && !_dots.textAt(column, row).empty() ? each.tint : tint;
+                }
+            }
+        }
+        return first;
     }
 
     /// The mark of each curve at its end, or in the next free row.
@@ -170,7 +188,7 @@ private:
             }
             taken[row] = true;
             _grid.put(_left + _columns + kMarkColumns - 1, _area.y + static_cast<int>(row),
-                      each.mark, {.bold = true});
+                      each.mark, {.bold = true, .tint = each.tint});
         }
     }
 

@@ -16,6 +16,7 @@ namespace pallax::terminal {
 struct PlotCurve {
     std::string mark; ///< stands at its end and tells it from others; empty: none
     Curve curve;
+    Tint tint = Tint::None;
 };
 
 /// Something that happened, as a mark above the time axis.

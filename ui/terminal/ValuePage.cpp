@@ -5,6 +5,7 @@
 #include "ui/terminal/EventText.h"
 #include "ui/terminal/PageTitle.h"
 #include "ui/terminal/TextWidth.h"
+#include "ui/terminal/Tints.h"
 
 #include <algorithm>
 #include <cmath>
@@ -143,9 +144,10 @@ std::string ValuePage::drawValue(const PageScreen& screen, const Content& conten
         grid.put(room.right - 1, kRowsAbove, screen.marks.more, kPaleFact);
     }
     std::string left;
-    if (!facts.grade.empty()) {
+    if (facts.grade) {
         const std::string borders = " (" + facts.borders + ")";
-        x = grid.put(x + kGap, kRowsAbove, facts.grade, {}, room);
+        x = grid.put(x + kGap, kRowsAbove, nameOf(*facts.grade), {.tint = tintOf(*facts.grade)},
+                     room);
         if (x + columnsOf(borders) + kGap <= ageAt) {
             (void)grid.put(x, kRowsAbove, borders, kPaleFact);
         } else {

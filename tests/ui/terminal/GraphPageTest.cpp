@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <set>
 #include <string>
 
 namespace pallax::terminal {
@@ -220,6 +221,23 @@ TEST_F(GraphPageTest, OnlyNumbersHaveACurve) {
     stage.moment = {};
     stage.type("v");
     EXPECT_TRUE(shows("Only numbers have a curve."));
+}
+
+TEST_F(GraphPageTest, EachCurveHasATintAndSoHasItsLetterInTheLegend) {
+    addLevels(stage);
+    stage.type("V");
+    const Grid grid = draw();
+    EXPECT_EQ(styleOf(grid, "a  "), Style{.tint = Tint::Blue});
+    EXPECT_EQ(styleOf(grid, "b  "), Style{.tint = Tint::Orange});
+    EXPECT_EQ(styleOf(grid, "c  "), Style{.tint = Tint::Green});
+    EXPECT_EQ(styleOf(grid, "-86.25 dBm"), Style{});
+    std::set<Tint> curves;
+    for (int y = 0; y < grid.rows(); ++y) {
+        for (int x = 8; x < grid.columns(); ++x) {
+            curves.insert(grid.at(x, y).style.tint);
+        }
+    }
+    EXPECT_EQ(curves, (std::set{Tint::None, Tint::Green, Tint::Blue, Tint::Orange}));
 }
 
 TEST_F(GraphPageTest, TheCursorReadsAllCurves) {

@@ -3,6 +3,7 @@
 #include "ui/terminal/Grid.h"
 #include "ui/terminal/TextWidth.h"
 
+#include <optional>
 #include <ostream>
 #include <string>
 
@@ -10,7 +11,28 @@ namespace pallax::terminal {
 
 inline void PrintTo(const Style& style, std::ostream* out) { // NOLINT: gtest's name
     *out << '{' << (style.bold ? " bold" : "") << (style.dim ? " dim" : "")
-         << (style.underline ? " underline" : "") << (style.accent ? " accent" : "") << " }";
+         << (style.underline ? " underline" : "") << (style.accent ? " accent" : "")
+         << (style.tint == Tint::None ? "" : " tint ");
+    if (style.tint != Tint::None) {
+        *out << static_cast<int>(style.tint);
+    }
+    *out << " }";
+}
+
+/// The style in which the first occurrence of a text begins; nothing if the grid lacks the text.
+inline std::optional<Style> styleOf(const Grid& grid, const std::string& wanted) {
+    for (int y = 0; y < grid.rows(); ++y) {
+        for (int x = 0; x < grid.columns(); ++x) {
+            std::string text;
+            for (int column = x; column < grid.columns() && text.size() < wanted.size(); ++column) {
+                text += grid.at(column, y).text;
+            }
+            if (text == wanted) {
+                return grid.at(x, y).style;
+            }
+        }
+    }
+    return std::nullopt;
 }
 
 /// The fault of a grid that a terminal could not show, or "": each cell must contain one printable

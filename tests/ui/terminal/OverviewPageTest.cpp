@@ -142,6 +142,27 @@ TEST_F(OverviewPageTest, ShowsStatusMessageAndNoteLikeAPane) {
     EXPECT_TRUE(shows(" Saved a.pallax"));
 }
 
+TEST_F(OverviewPageTest, AQualityAndItsBarHaveATintUnlessTheLevelIsOverdue) {
+    StatusValue level{"RSRP", "lte.serving_cell_measurements.measured_rsrp", "-92 dBm", -92, {},
+                      kNow};
+    level.grade = Grade::Fair;
+    stage.overview.status.cells = {{"LTE", "", {}, {}, "", {}, {level}}};
+    level.grade = Grade::Poor;
+    stage.overview.status.neighbours = {{"LTE", "PCI 1", level}};
+    stage.type("o");
+    const Grid now = draw();
+    EXPECT_EQ(styleOf(now, "-92 dBm  fair"), Style{});
+    EXPECT_EQ(styleOf(now, "fair"), Style{.tint = Tint::Orange});
+    EXPECT_EQ(styleOf(now, "▆▆"), Style{.tint = Tint::Orange});
+    EXPECT_EQ(styleOf(now, "poor"), Style{.tint = Tint::Red});
+    stage.overview.status.cells.front().levels.front().patience = std::chrono::seconds(1);
+    stage.overview.status.time = kNow + std::chrono::seconds(2);
+    const Grid later = draw();
+    EXPECT_EQ(styleOf(later, "fair"), Style{.dim = true});
+    EXPECT_EQ(styleOf(later, "▆▆"), Style{.dim = true});
+    EXPECT_EQ(styleOf(later, "poor"), Style{.tint = Tint::Red});
+}
+
 TEST_F(OverviewPageTest, SaysSoIfNothingIsKnown) {
     stage.overview = {};
     stage.type("o");

@@ -157,6 +157,20 @@ TEST(Plot, TheCursorIsShownByStyleToo) {
     EXPECT_EQ(accents, 6);
 }
 
+TEST(Plot, ACurveAndItsMarkHaveItsTint) {
+    Plot plot = plotOf({slope(), {at(0, -82), at(20, -82), at(40, -91), at(58, -91)}});
+    plot.curves[0].tint = Tint::Blue;
+    plot.curves[1].tint = Tint::Orange;
+    Grid grid(50, 7);
+    drawPlot(grid, kUtf8Marks, plot, {0, 0, 50, 7}, labelColumns(plot, 7));
+    EXPECT_EQ(styleOf(grid, "a"), (Style{.bold = true, .tint = Tint::Blue}));
+    EXPECT_EQ(styleOf(grid, "b"), (Style{.bold = true, .tint = Tint::Orange}));
+    EXPECT_EQ(styleOf(grid, "⣀⠤⠒⠉⠁"), Style{.tint = Tint::Blue});
+    EXPECT_EQ(styleOf(grid, "⠤⠤⠤⠤⠤"), Style{.tint = Tint::Orange});
+    EXPECT_EQ(styleOf(grid, "⢀⡩⠕⠪"), Style{.tint = Tint::Blue}) << "where both are, the first";
+    EXPECT_EQ(styleOf(grid, "dBm"), Style{.dim = true});
+}
+
 TEST(Plot, FitsIntoAreasOfAnySize) {
     Plot plot = plotOf({slope(), {at(0, 1e300), at(30, -1e300)}, {}, {at(5, 0.0001)}});
     plot.events = {{kStart - seconds(5), "before"}, {kStart + seconds(500), "after"}};

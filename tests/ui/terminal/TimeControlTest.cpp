@@ -150,6 +150,16 @@ TEST_F(AsciiTimeControlTest, AHeldInstantInAscii) {
 )");
 }
 
+TEST_F(TimeControlTest, TheMarkHasATint) {
+    goTo("+60s");
+    stage.type("m");
+    stage.press(Key::Down); // the message goes
+    goTo("+90s");
+    const Grid grid = stage.frontEnd.draw();
+    EXPECT_EQ(styleOf(grid, "◆"), Style{.tint = Tint::Purple});
+    EXPECT_EQ(styleOf(grid, "●"), Style{.accent = true});
+}
+
 TEST_F(TimeControlTest, TheChangesSinceTheMark) {
     stage.type("d");
     EXPECT_TRUE(shows("Mark an instant first, with the key m."));

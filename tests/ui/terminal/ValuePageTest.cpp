@@ -100,6 +100,13 @@ TEST_F(ValuePageTest, WithoutACurveLeftGoesBack) {
     EXPECT_FALSE(shows("y copy"));
 }
 
+TEST_F(ValuePageTest, TheQualityHasATint) {
+    show(last());
+    select(kMeasurements, kRsrp);
+    stage.type("i");
+    EXPECT_EQ(styleOf(draw(), "excellent"), Style{.tint = Tint::Green});
+}
+
 TEST_F(ValuePageTest, AValueThatDoesNotFitEndsInAMark) {
     stage.tick(Dictionary{{"SIM Info", Dictionary{{"IMSI", std::string(200, '1')}}}});
     select("SIM Info", "IMSI");
