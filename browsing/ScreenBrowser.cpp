@@ -206,6 +206,16 @@ void ScreenBrowser::tick() {
         }
     }
     _frontEnd.setAlarms(_alarms.holding());
+    tellTrouble();
+}
+
+/// Once: a file that grows goes on growing.
+void ScreenBrowser::tellTrouble() {
+    const auto trouble = _hasToldTrouble ? std::nullopt : _timeline.trouble();
+    if (trouble) {
+        _hasToldTrouble = true;
+        _frontEnd.setMessage(*trouble);
+    }
 }
 
 /// The history is that of the shell of `pallax sql`, where a query ends in ";" and other lines are
@@ -291,6 +301,9 @@ void ScreenBrowser::readKey() {
     if (const auto key = _terminal.read()) {
         _workBegan.reset();
         _frontEnd.handle(*key);
+        if (_travel.isAway()) {
+            tellTrouble();
+        }
         _link.queue().async([this] { readKey(); });
     } else if (_terminal.isHungUp()) {
         _session.quit();

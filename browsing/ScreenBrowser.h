@@ -45,6 +45,7 @@ private:
     void readKey();
     void begin(const std::string& technology);
     void tick();
+    void tellTrouble();
     void needsDisplay();
     void display();
     void keepTurning();
@@ -64,6 +65,7 @@ private:
     Travel _travel;
     std::optional<std::chrono::steady_clock::time_point> _workBegan; ///< since the latest key
     std::chrono::steady_clock::time_point _lookedForKey;
+    bool _hasToldTrouble = false; ///< that of the timeline
     AlarmWatch _alarms;
     std::uint64_t _ticks = 0;
     std::optional<NetworkNames> _names; ///< read when a page asks for the first time

@@ -59,6 +59,11 @@ Timeline* ViewedTimeline::timeline() {
     return _whole != nullptr ? _whole.get() : _live.timeline();
 }
 
+std::optional<std::string> ViewedTimeline::trouble() {
+    Timeline* known = timeline();
+    return known == nullptr ? std::nullopt : known->journal().trouble();
+}
+
 std::uint64_t ViewedTimeline::present() {
     const Timeline* known = timeline();
     if (known == nullptr) {

@@ -8,6 +8,8 @@
 #include <cstdint>
 #include <functional>
 #include <memory>
+#include <optional>
+#include <string>
 #include <string_view>
 
 namespace pallax {
@@ -40,6 +42,8 @@ public:
 
     /// Null before the first packet.
     Timeline* timeline();
+    /// Why packets are missing: one sentence. Nothing while all is well.
+    std::optional<std::string> trouble();
     /// The latest instant that the source has reached.
     std::uint64_t present();
 

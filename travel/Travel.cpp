@@ -16,9 +16,18 @@ namespace pallax {
 namespace {
 
 constexpr const char* kNoPacket = "No packet has come yet.";
+constexpr const char* kGone = "The packets of this time can no longer be read.";
 constexpr int kFastest = 8; // 256 times
 constexpr int kSlowest = -3;
 constexpr std::chrono::seconds kShownPause{2}; // how much of a pause is played
+
+/// A condition that begins with a number compares it.
+bool looksLikeTime(std::string_view text) {
+    constexpr std::string_view kBegins = "0123456789+-";
+    constexpr std::string_view kCompares = "<>=! (";
+    return !text.empty() && kBegins.find(text.front()) != std::string_view::npos &&
+           text.find_first_of(kCompares) == std::string_view::npos;
+}
 
 TimeSpan spanOf(const Timeline& timeline) {
     TimeSpan span{timeline.stretches().front().first, timeline.stretches().front().latest, {}};
@@ -82,8 +91,12 @@ Travel::Refusal Travel::holdOrPlay() {
     if (timeline() == nullptr) {
         return kNoPacket;
     }
+    const std::optional<Time> from = time();
+    if (!from) {
+        return kGone;
+    }
     if (_instant && !_playing) {
-        _playing = Playing{_surroundings.steadyNow(), *time()};
+        _playing = Playing{_surroundings.steadyNow(), *from};
     } else {
         hold(shown());
     }
@@ -131,7 +144,7 @@ Travel::Refusal Travel::stepTime(std::chrono::nanoseconds distance) {
     Timeline* known = timeline();
     const std::optional<Time> from = time();
     if (!from) {
-        return kNoPacket;
+        return known == nullptr ? kNoPacket : kGone;
     }
     hold(instantBeside(*known, shown(), *from + distance));
     return std::nullopt;
@@ -196,6 +209,9 @@ Travel::Refusal Travel::goTo(std::string_view text) {
     }
     if (const auto time = TimeText::parse(text)) {
         return goToTime(*time);
+    }
+    if (looksLikeTime(text)) {
+        return TimeText::parse(text).error().sentence;
     }
     const auto condition = QueryCondition::compile(
         text, timeline()->fields(), QueryCondition::About::State, _surroundings.knowledge);

@@ -149,6 +149,8 @@ TEST_F(TravelTest, GoesToATime) {
     EXPECT_NEAR(seconds(), 110.0, 0.2);
     const std::uint64_t before = shown();
     EXPECT_NE(told(travel.goTo("03:00")), "done");
+    EXPECT_EQ(told(travel.goTo("25:99")), TimeText::parse("25:99").error().sentence);
+    EXPECT_EQ(told(travel.goTo("-5")), TimeText::parse("-5").error().sentence);
     EXPECT_EQ(shown(), before);
 }
 

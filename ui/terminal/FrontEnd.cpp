@@ -74,7 +74,7 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .message = _message,
                             .note = _note,
                             .origin = _origin,
-                            .oldValues = _oldValues,
+                            .oldValues = _time.isAway() ? std::string() : _oldValues,
                             .stream = _stream,
                             .alarms = _alarms,
                             .zone = _surroundings.zone(),

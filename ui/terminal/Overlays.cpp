@@ -83,6 +83,11 @@ int drawHelp(Grid& grid, const Marks& marks, int first, std::optional<HelpPlace>
             grid.put(box.inside().left, box.y + 1 + row, line, {}, box.inside());
         }
     }
+    const int below = static_cast<int>(lines.size()) - begin - shown;
+    if (below > 0) {
+        const std::string text = std::string(" ").append(marks.down) + " " + std::to_string(below);
+        grid.put(box.inside().right - columnsOf(text) - 1, box.y + box.rows - 1, text + " ");
+    }
     return shown;
 }
 

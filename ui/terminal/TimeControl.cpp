@@ -95,7 +95,7 @@ Travel::Refusal TimeControl::setMark() {
 }
 
 Travel::Refusal TimeControl::tellSpeed() {
-    return "Playing speed " + travel()->speedText();
+    return (isAway() ? "Playing speed " : "What is held will play at ") + travel()->speedText();
 }
 
 void TimeControl::tell(const Travel::Refusal& refusal) {

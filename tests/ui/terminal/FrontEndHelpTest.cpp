@@ -77,14 +77,14 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
    │  open the row                  │
    │ Right Left  l h                │
  ──│  scroll a long row             │──
- Up└────────────────────────────────┘lp
+ Up└───────────────────────── ↓ 54 ─┘lp
 )");
     EXPECT_EQ(stage.screen(20, 5), R"(
 ┌ Keys ────────────┐
 │ Up Down  k j     │
 │  one row up or   │
 │  down            │
-└──────────────────┘
+└─────────── ↓ 89 ─┘
 )");
 }
 

@@ -145,7 +145,7 @@ TEST(OverlaysTest, TheHelpPageIsShownFromALineOn) {
 | PgUp PgDn        |
 |  one page up or  |
 |  down            |
-+------------------+
++----------- v 92 -+
 )");
 }
 
