@@ -1,5 +1,7 @@
 #include "timeline/Series.h"
 
+#include "timeline/ValueReader.h"
+
 #include <algorithm>
 #include <functional>
 #include <map>
@@ -10,44 +12,23 @@ namespace pallax {
 namespace {
 
 /// Gives the readings of one field, in all entries.
-class FieldReader final : public SampleSink, private CurrentValues::Listener {
+class FieldReader final : public ValueReader {
 public:
     using Take =
         std::function<void(const SamplePacket& packet, EntryId entry, const FieldValue& value)>;
 
     FieldReader(Timeline& timeline, FieldIndex field, Take take)
-        : _values(timeline.fieldTable(), timeline.entryTable()), _field(field),
-          _take(std::move(take)) {
-        _values.setListener(this);
-    }
-
-    void beginPacket(const SamplePacket& packet) override {
-        _packet = packet;
-        _values.beginPacket(packet);
-    }
-    void beginSection(std::string_view section) override { _values.beginSection(section); }
-    void sample(const Sample& sample) override { _values.sample(sample); }
-    void keyRemoved(std::string_view key) override { _values.keyRemoved(key); }
-    void beginList(const SampleList& list) override { _values.beginList(list); }
-    void endList() override { _values.endList(); }
-    void beginEntry(std::size_t index, std::int64_t name) override {
-        _values.beginEntry(index, name);
-    }
-    void endEntry() override { _values.endEntry(); }
+        : ValueReader(timeline), _field(field), _take(std::move(take)) {}
 
 private:
     void valueRead(FieldIndex field, EntryId entry, const FieldValue& value) override {
         if (field == _field) {
-            _take(_packet, entry, value);
+            _take(packet(), entry, value);
         }
     }
-    void valueRemoved(FieldIndex /*field*/) override {}
-    void listReplaced(ListId /*list*/) override {}
 
-    CurrentValues _values;
     FieldIndex _field;
     Take _take;
-    SamplePacket _packet;
 };
 
 /// Up to this number of packets, buckets are read from the packets themselves.

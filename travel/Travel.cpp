@@ -219,6 +219,7 @@ Travel::Refusal Travel::goTo(std::string_view text) {
         return condition.error();
     }
     _condition = text;
+    ++_conditions;
     return findFrom(Direction::Forward);
 }
 

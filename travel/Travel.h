@@ -62,6 +62,8 @@ public:
     Refusal goTo(std::string_view text);
     /// Where the latest condition becomes true next, or became true before.
     Refusal findAgain(Direction direction);
+    /// How many conditions the user has gone to.
+    std::size_t conditions() const { return _conditions; }
     /// Shows the present.
     void release();
     /// Forgets all instants: the timeline is another one.
@@ -110,7 +112,8 @@ private:
     std::optional<Playing> _playing;
     int _speed = 0; ///< a power of two
     std::optional<std::uint64_t> _marked;
-    std::string _condition;
+    std::string _condition; ///< the latest
+    std::size_t _conditions = 0;
 };
 
 } // namespace pallax

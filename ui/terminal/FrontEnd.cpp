@@ -19,7 +19,7 @@ FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
       _time({_surroundings.travel, _toolkit,
              [this](std::string text) { setMessage(std::move(text)); },
              [this] { needsDisplay(); }}),
-      _shown(_surroundings.valueSource()) {
+      _shown(_surroundings.valueSource()), _finder(finderSurroundings()) {
     _toolkit.lists().partAt = _surroundings.entryPart;
 }
 
@@ -239,7 +239,7 @@ bool FrontEnd::handleTime(const KeyEvent& event) {
         openChanges();
         return true;
     }
-    return _time.handle(event);
+    return findAgain(event) || _time.handle(event);
 }
 
 void FrontEnd::openChanges() {

@@ -13,6 +13,7 @@
 #include "ui/terminal/Pages.h"
 #include "ui/terminal/ShownValues.h"
 #include "ui/terminal/TerminalToolkit.h"
+#include "ui/terminal/TextFinder.h"
 #include "ui/terminal/TimeControl.h"
 
 #include <chrono>
@@ -78,6 +79,7 @@ public:
     void openOverview();
     void openEvents();
     void openQuery();
+    void openSearch();
 
     /// Whether lists open as tables, until the user chooses otherwise.
     void showListsAsTables(bool asTables) { _toolkit.lists().asTables = asTables; }
@@ -105,6 +107,13 @@ public:
     void turn();
 
 private:
+    /// What was searched last.
+    struct Search {
+        std::string text;
+        SearchScope scope;
+        std::size_t conditions; ///< how many there were
+    };
+
     void needsDisplay();
     void drawScreen(Grid& grid, TerminalNavigation& navigation);
     void handleMouse(const KeyEvent& event);
@@ -126,6 +135,13 @@ private:
     void openValue(PaneLeaf leaf);
     void openGraph();
     void handleValueKey(char32_t character);
+    TextFinder::Surroundings finderSurroundings();
+    std::size_t conditions() const;
+    void noteSearch(const std::string& text, SearchScope scope);
+    void goToPlace(const std::vector<std::size_t>& place);
+    bool findAgain(const KeyEvent& event);
+    void findRowAgain(bool isForward);
+    void findInstantAgain(bool isForward);
     std::string curveOfRow(const std::string& path, int columns);
     Overview overviewWithCurves();
     void goBack(TerminalTable& table);
@@ -148,6 +164,8 @@ private:
     HelpPage _help;
     ShownValues _shown;
     Graph _graph;
+    TextFinder _finder;
+    std::optional<Search> _search; ///< the latest from which the user went to a hit
     Pages _pages;
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
     std::weak_ptr<ui::TableScreen> _filteredPane; ///< the pane of the filter

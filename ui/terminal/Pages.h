@@ -5,6 +5,7 @@
 #include "ui/terminal/GraphPage.h"
 #include "ui/terminal/OverviewPage.h"
 #include "ui/terminal/QueryPage.h"
+#include "ui/terminal/SearchPage.h"
 #include "ui/terminal/ValuePage.h"
 
 #include <utility>
@@ -13,7 +14,8 @@
 
 namespace pallax::terminal {
 
-using Page = std::variant<OverviewPage, ChangesPage, EventsPage, QueryPage, ValuePage, GraphPage>;
+using Page = std::variant<OverviewPage, ChangesPage, EventsPage, QueryPage, SearchPage, ValuePage,
+                          GraphPage>;
 
 /// The pages over the panes, the last one on top. They are not on the navigation stack, whose panes
 /// are updated meanwhile.

@@ -61,6 +61,8 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return openEvents();
     case U';':
         return openQuery();
+    case U'f':
+        return openSearch();
     case U'i':
     case U'v':
     case U'V':

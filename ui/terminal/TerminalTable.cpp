@@ -167,6 +167,24 @@ void TerminalTable::moveCursorTo(std::size_t shown) {
     _needsDisplay();
 }
 
+void TerminalTable::select(std::size_t row) {
+    const auto selects = [this, row] {
+        const ColumnTable* const table = list();
+        const std::size_t count = shownRows();
+        for (std::size_t shown = 0; shown < count; ++shown) {
+            if ((table != nullptr ? table->model().rowAt(shown) : pane().rowAt(shown)) == row) {
+                moveCursorTo(shown);
+                return true;
+            }
+        }
+        return false;
+    };
+    if (!selects() && !filter().empty()) {
+        setFilter("");
+        (void)selects();
+    }
+}
+
 void TerminalTable::scroll(std::ptrdiff_t rows) {
     const auto last = static_cast<std::ptrdiff_t>(lastFirstShown());
     const auto target = static_cast<std::ptrdiff_t>(_firstShown) + rows;

@@ -65,6 +65,8 @@ public:
     /// Moves the cursor by so many rows, stopping at the ends.
     void moveCursor(std::ptrdiff_t rows);
     void moveCursorTo(std::size_t shown);
+    /// Moves the cursor to a row of the source. Clears the filter if it hides the row.
+    void select(std::size_t row);
     /// Moves the window by this many rows, stopping at the ends; the cursor stays inside.
     void scroll(std::ptrdiff_t rows);
     /// The height of the window less one row.

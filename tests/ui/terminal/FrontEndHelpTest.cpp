@@ -25,16 +25,16 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
  Pallax › Serving Cell Measurements
  ──────────────────────────────────────────────────────────────────────────────
 ▌Version                                                                     1
- E-ARFCN                                                                  1850
- Physical Cell┌ Keys ───────────────────────────────────────────┐          274
- Measured RSRP│ Up Down  k j      one row up or down            │   -94.75 dBm
- Average RSRP │ PgUp PgDn         one page up or down           │   -95.00 dBm
- Measured RSRQ│ Home End  g G     first or last row             │     -9.50 dB
-              │ Enter Right l     open the row                  │
+ E-ARFCN      ┌ Keys ───────────────────────────────────────────┐         1850
+ Physical Cell│ Up Down  k j      one row up or down            │          274
+ Measured RSRP│ PgUp PgDn         one page up or down           │   -94.75 dBm
+ Average RSRP │ Home End  g G     first or last row             │   -95.00 dBm
+ Measured RSRQ│ Enter Right l     open the row                  │     -9.50 dB
               │ Right Left  l h   scroll a long row             │
               │ Left h Backspace  back                          │
               │ Esc               clear the filter, or back     │
               │ /                 filter rows by name or value  │
+              │ f                 find a text in all values     │
               │ t                 a list as a table or as rows  │
               │ < > r  x X        sort a table; hide columns    │
               │ o                 overview of the radio         │
@@ -47,7 +47,7 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
               │ { }               one minute back or forward    │
               │ ^ $               to the start; present or end  │
               │ :                 go to a time or a condition   │
-              │ n N               where it holds next or before │
+              │ n N               next or previous place found  │
               │ m d               mark; changes since the mark  │
               │ ( )               play slower or faster         │
               │ s                 save a snapshot               │
@@ -77,14 +77,14 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
    │  open the row                  │
    │ Right Left  l h                │
  ──│  scroll a long row             │──
- Up└───────────────────────── ↓ 54 ─┘lp
+ Up└───────────────────────── ↓ 56 ─┘lp
 )");
     EXPECT_EQ(stage.screen(20, 5), R"(
 ┌ Keys ────────────┐
 │ Up Down  k j     │
 │  one row up or   │
 │  down            │
-└─────────── ↓ 89 ─┘
+└─────────── ↓ 93 ─┘
 )");
 }
 
@@ -128,11 +128,11 @@ TEST_F(FrontEndHelpTest, TheArrowsScrollItWhereItDoesNotFit) {
     (void)stage.frontEnd.draw();
     stage.press(Key::Down);
     EXPECT_EQ(stage.line(1), "│  one row up or   │");
-    stage.press(Key::Down, 90);
+    stage.press(Key::Down, 120);
     EXPECT_EQ(stage.line(3), "│  quit            │");
     stage.press(Key::Up);
     EXPECT_EQ(stage.line(3), "│ Ctrl-C           │");
-    stage.press(Key::Up, 90);
+    stage.press(Key::Up, 120);
     EXPECT_EQ(stage.line(1), "│ Up Down  k j     │");
 }
 
@@ -177,7 +177,7 @@ TEST_F(FrontEndHelpTest, ScrolledToItsEndItFillsAScreenThatGrows) {
     const std::string fromTheFirstLine = stage.screen(80, 42);
     stage.frontEnd.resize(20, 5);
     (void)draw();
-    stage.press(Key::Down, 90);
+    stage.press(Key::Down, 120);
     EXPECT_EQ(stage.screen(20, 7), R"(
 ┌ Keys ────────────┐
 │  back; at the    │

@@ -107,6 +107,7 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ Left h Backspace  back                          │
 │ Esc               clear the filter, or back     │
 │ /                 filter rows by name or value  │
+│ f                 find a text in all values     │
 │ t                 a list as a table or as rows  │
 │ < > r  x X        sort a table; hide columns    │
 │ o                 overview of the radio         │
@@ -120,7 +121,7 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ { }               one minute back or forward    │
 │ ^ $               to the start; present or end  │
 │ :                 go to a time or a condition   │
-│ n N               where it holds next or before │
+│ n N               next or previous place found  │
 │ m d               mark; changes since the mark  │
 │ ( )               play slower or faster         │
 │ s                 save a snapshot               │
@@ -145,7 +146,7 @@ TEST(OverlaysTest, TheHelpPageIsShownFromALineOn) {
 | PgUp PgDn        |
 |  one page up or  |
 |  down            |
-+----------- v 92 -+
++----------- v 96 -+
 )");
 }
 
