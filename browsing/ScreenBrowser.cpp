@@ -206,16 +206,15 @@ void ScreenBrowser::tick() {
         }
     }
     _frontEnd.setAlarms(_alarms.holding());
-    tellTrouble();
 }
 
-/// Once: a file that grows goes on growing.
+/// Says why the past is not whole, each time it is looked at.
 void ScreenBrowser::tellTrouble() {
-    const auto trouble = _hasToldTrouble ? std::nullopt : _timeline.trouble();
-    if (trouble) {
-        _hasToldTrouble = true;
+    auto trouble = _travel.isAway() ? _timeline.trouble() : std::nullopt;
+    if (trouble && trouble != _toldTrouble) {
         _frontEnd.setMessage(*trouble);
     }
+    _toldTrouble = std::move(trouble);
 }
 
 /// The history is that of the shell of `pallax sql`, where a query ends in ";" and other lines are
@@ -301,9 +300,7 @@ void ScreenBrowser::readKey() {
     if (const auto key = _terminal.read()) {
         _workBegan.reset();
         _frontEnd.handle(*key);
-        if (_travel.isAway()) {
-            tellTrouble();
-        }
+        tellTrouble();
         _link.queue().async([this] { readKey(); });
     } else if (_terminal.isHungUp()) {
         _session.quit();

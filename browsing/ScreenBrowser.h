@@ -65,7 +65,7 @@ private:
     Travel _travel;
     std::optional<std::chrono::steady_clock::time_point> _workBegan; ///< since the latest key
     std::chrono::steady_clock::time_point _lookedForKey;
-    bool _hasToldTrouble = false; ///< that of the timeline
+    std::optional<std::string> _toldTrouble; ///< of the timeline, since time is held
     AlarmWatch _alarms;
     std::uint64_t _ticks = 0;
     std::optional<NetworkNames> _names; ///< read when a page asks for the first time
