@@ -135,6 +135,7 @@ bool ScreenBrowser::mayGoOn(const std::string& words) {
         if (key->key == terminal::Key::Escape) {
             return false;
         }
+        _typedAhead.push_back(*key);
     }
     return true;
 }
@@ -297,7 +298,14 @@ void ScreenBrowser::waitForKey() {
 
 /// One key at a time: what it posts to the queue comes before the next one.
 void ScreenBrowser::readKey() {
-    if (const auto key = _terminal.read()) {
+    std::optional<terminal::KeyEvent> key;
+    if (_typedAhead.empty()) {
+        key = _terminal.read();
+    } else {
+        key = _typedAhead.front();
+        _typedAhead.pop_front();
+    }
+    if (key) {
         _workBegan.reset();
         _frontEnd.handle(*key);
         tellTrouble();

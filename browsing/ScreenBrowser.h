@@ -14,6 +14,7 @@
 
 #include <chrono>
 #include <cstdint>
+#include <deque>
 #include <memory>
 #include <optional>
 
@@ -65,7 +66,8 @@ private:
     Travel _travel;
     std::optional<std::chrono::steady_clock::time_point> _workBegan; ///< since the latest key
     std::chrono::steady_clock::time_point _lookedForKey;
-    std::optional<std::string> _toldTrouble; ///< of the timeline, since time is held
+    std::deque<terminal::KeyEvent> _typedAhead; ///< keys that came during work
+    std::optional<std::string> _toldTrouble;    ///< of the timeline, since time is held
     AlarmWatch _alarms;
     std::uint64_t _ticks = 0;
     std::optional<NetworkNames> _names; ///< read when a page asks for the first time
