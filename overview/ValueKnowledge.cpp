@@ -7,6 +7,7 @@
 #include "text/Format.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace pallax {
 
@@ -58,7 +59,8 @@ std::vector<std::string> wordsOfChannel(RadioSystem system, std::uint32_t number
     if (carriers.size() > 1) {
         if (const auto frequency = megahertz(system, number)) {
             constexpr double kHertz = 1e6;
-            words.push_back(megahertzText(static_cast<Hertz>(*frequency * kHertz + 0.5)) + " MHz");
+            words.push_back(megahertzText(static_cast<Hertz>(std::llround(*frequency * kHertz))) +
+                            " MHz");
         }
         return words;
     }

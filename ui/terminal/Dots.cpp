@@ -50,7 +50,9 @@ void Dots::line(int fromX, int fromY, int toX, int toY) {
 
 std::string Dots::textAt(int column, int row) const {
     constexpr std::array<const char*, 4> kBlocks{"", "▀", "▄", "█"}; // upper half, lower half
-    const unsigned bits = _cells[static_cast<std::size_t>(row * _columns + column)];
+    const unsigned bits =
+        _cells[static_cast<std::size_t>(row) * static_cast<std::size_t>(_columns) +
+               static_cast<std::size_t>(column)];
     std::string text;
     switch (_curves) {
     case Curves::Braille:
