@@ -157,7 +157,8 @@ private:
     }
 
     std::size_t cellAt(int column, int row) const {
-        return static_cast<std::size_t>(row * _columns + column);
+        return static_cast<std::size_t>(row) * static_cast<std::size_t>(_columns) +
+               static_cast<std::size_t>(column);
     }
 
     /// Returns the tint of each cell that has dots: that of the first curve in it.
