@@ -117,7 +117,7 @@ private:
         return static_cast<std::size_t>(found - _columns.begin());
     }
 
-    /// Without identity columns, entries are told apart by their places.
+    /// Without identity columns, the place of an entry is its identity.
     TableRow rowOf(const PallaxModelNode& entry) {
         TableRow row{{}, std::vector<TableCell>(_columns.size())};
         for (const NodeRef& child : *entry.childNodes()) {

@@ -132,7 +132,7 @@ TEST_F(EndToEndTerminal, ColoursFollowOptionAndEnvironment) {
 }
 
 TEST_F(EndToEndTerminal, QualityHasTheColoursThatTheTerminalHas) {
-    // The type of a terminal that is told red, green and blue; the system may lack one.
+    // A terminal type with direct colour, which the system may lack.
     std::ofstream(world.path("direct.src"))
         << "pallax-direct|for a test, RGB, colors#0x1000000, pairs#0x7FFF, "
            "setaf=\\E[%?%p1%{8}%<%t3%p1%d%e38\\:2\\:%p1%{65536}%/%d\\:"

@@ -1,17 +1,12 @@
 #include "ui/terminal/ChangesPage.h"
 
+#include "ui/terminal/EventText.h"
+
 namespace pallax::terminal {
 
 namespace {
 
 constexpr std::string_view kNothingDiffers = "Nothing differs.";
-constexpr std::string_view kChangeArrow = "→";
-
-/// A line with an arrow of the marks.
-std::string withMarks(std::string line, const Marks& marks) {
-    const std::size_t arrow = marks.asciiOnly ? line.find(kChangeArrow) : std::string::npos;
-    return arrow == std::string::npos ? line : line.replace(arrow, kChangeArrow.size(), "->");
-}
 
 } // namespace
 
@@ -31,7 +26,7 @@ void ChangesPage::draw(const PageScreen& screen, const PageSurroundings& around)
     const int end = std::min(lines, _scrolling.first() + frame.rows());
     for (int line = _scrolling.first(); line < end; ++line) {
         const std::string text =
-            withMarks(content.lines[static_cast<std::size_t>(line)], screen.marks);
+            eventWords(content.lines[static_cast<std::size_t>(line)], screen.marks);
         const bool isTitle = !text.starts_with(' ');
         screen.grid.put(kMargin, kRowsAbove + line - _scrolling.first(), text, {.bold = isTitle},
                         frame.span());

@@ -11,7 +11,7 @@ namespace pallax::terminal {
 /// The time of day of an event: "22:14:06", so much ahead of UTC.
 std::string eventTime(Time time, std::chrono::seconds ahead);
 
-/// The words of an event, which have an arrow, in the characters of the terminal.
+/// Words that may have an arrow, as those of an event, in the characters of the terminal.
 std::string eventWords(std::string words, const Marks& marks);
 
 } // namespace pallax::terminal

@@ -32,8 +32,8 @@ QueryAnswer answerQuery(Timeline& timeline, const std::string& query,
                         const std::function<bool()>& mayGoOn,
                         const std::function<void(Database&, Timeline&)>& addFunctions);
 
-/// The packet that a row of an answer tells of: by a column `packet`, or by the time in a column
-/// `time`. Nothing if the row tells of none.
+/// The packet of a row: the number in its column `packet`, or the latest packet at the time in its
+/// column `time`. Nothing if it has neither.
 std::optional<std::uint64_t> packetOf(const TableContent& table, std::size_t row,
                                       const Timeline& timeline);
 
