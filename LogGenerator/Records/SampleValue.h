@@ -62,8 +62,8 @@ public:
             target.assign(Text::fixed(label->text));
         } else if (const PropertyList* whole = object()) {
             target = *whole;
-        } else {
-            target.assign(Text(words()));
+        } else if (const Text* held = target.text(); held == nullptr || held->view() != words()) {
+            target.assign(Text(words())); // most texts repeat
         }
     }
 
