@@ -22,7 +22,7 @@ public:
     struct Limits {
         std::chrono::nanoseconds age = std::chrono::hours(24); ///< by the packets' times
         std::uint64_t bytes = std::uint64_t{256} << 20U;       ///< of memory and file
-        std::uint64_t memory = std::uint64_t{8} << 20U;        ///< of these, in memory
+        std::uint64_t memory = std::uint64_t{1} << 20U;        ///< of these, in memory
     };
 
     /// `folder` is made if it is missing, when memory does not suffice; see `stateFolder`.
