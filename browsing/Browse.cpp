@@ -172,8 +172,9 @@ ExitStatus browseWithLog(const Request& request) {
     if (const auto missing = file != nullptr ? missingParts(file->parts()) : std::nullopt) {
         complain(*missing);
     }
+    const auto* modem = std::get_if<ServiceModem>(&source);
     std::unique_ptr<ChildService> child;
-    if (!std::holds_alternative<ServiceModem>(source)) {
+    if (modem == nullptr) {
         auto started = startChild(request.options);
         if (!started) {
             complain(started.error().sentence);
@@ -181,7 +182,7 @@ ExitStatus browseWithLog(const Request& request) {
         }
         child = std::move(started).value();
     }
-    auto directory = SocketDirectory::open();
+    auto directory = SocketDirectory::open(modem != nullptr ? modem->name : "");
     if (!directory) {
         complain(directory.error().sentence);
         return kExitFailure;

@@ -215,6 +215,14 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
                "The recording or saved snapshot to browse (pcap or pcapng, a file or a named "
                "pipe; - is standard input; default: the live modem), or the numbered parts of one")
             ->type_name("");
+    app.add_option_function<std::string>(
+           "--connect",
+           [&options](const std::string& name) {
+               options.source = ServiceModem{serviceNameOf("--connect", name)};
+           },
+           "The live modem of the service that has this name")
+        ->excludes(recording)
+        ->type_name("NAME");
     addView(app, options);
     addPlay(app, options.play, recording);
     app.footer(kFooter);
@@ -226,7 +234,7 @@ void addEvents(CLI::App& app, EventsOptions& options) {
     app.add_flag("--json", options.json, "JSON, one object per line");
     app.add_option("--where", options.where, "List only the events for which this holds")
         ->type_name("CONDITION");
-    CLI::Option* live = addLive(app, options.live, options.duration);
+    CLI::Option* live = addLive(app, options.live, options.duration, options.service);
     app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
         ->excludes(live)
         ->type_name("");
@@ -278,6 +286,7 @@ void addRecord(CLI::App& app, RecordOptions& options) {
     app.add_flag_callback(
         "--overwrite", [&options] { options.files.existing = PcapNgWriter::Existing::Overwrite; },
         "Replace existing files");
+    addConnect(app, options.service);
     addLogLevel(app, options.logLevel);
     app.footer(kRecordFooter);
 }

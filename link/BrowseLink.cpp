@@ -23,7 +23,8 @@ BrowseLink::BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, C
       _linkPorts({_socketPorts, _telephony,
                   formatText("%@.Viewer.%d", {ModemLink::kLocalPortName, ::getpid()}),
                   [this] { return _socketPorts.lastError(); },
-                  [this] { return _socketPorts.isTaken(_controlPortName); }}),
+                  [this] { return _socketPorts.isTaken(_controlPortName); },
+                  _socketPorts.directory().service()}),
       _ports(_linkPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
       _resources(DirectoryResources::programFolder()) {}
 

@@ -1,0 +1,57 @@
+#include "tests/cli/ParsedOptions.h"
+
+// Options that name a telephony service.
+
+namespace pallax {
+namespace {
+
+constexpr const char* kRule = " is no name of 1 to 32 letters, digits, \"-\", \"_\" and \".\" that "
+                              "begins with neither \"-\" nor \".\" (see pallax ";
+
+TEST(Options, AServiceCanHaveAName) {
+    EXPECT_EQ(parsed<ServiceOptions>({"service", "--simulate", "lte"}).name, "");
+    EXPECT_EQ(parsed<ServiceOptions>({"service", "--name", "car1", "--simulate", "lte"}).name,
+              "car1");
+    EXPECT_EQ(parsed<ServiceStatusOptions>({"service", "--status"}).name, "");
+    EXPECT_EQ(parsed<ServiceStatusOptions>({"service", "--status", "--name", "car1"}).name, "car1");
+    (void)parsed<ServiceListOptions>({"service", "--list"});
+    EXPECT_EQ(ended({"service", "--name", "a/b", "--simulate", "lte"}).text,
+              std::string("pallax: --name: \"a/b\"") + kRule + "service --help)\n");
+    for (const std::vector<std::string>& further :
+         {std::vector<std::string>{"--simulate", "lte"}, std::vector<std::string>{"--status"},
+          std::vector<std::string>{"--name", "car1"}, std::vector<std::string>{"--relay", "-"}}) {
+        std::vector<std::string> arguments{"service", "--list"};
+        arguments.insert(arguments.end(), further.begin(), further.end());
+        EXPECT_EQ(ended(arguments).status, kExitWrongUsage) << further.front();
+    }
+    EXPECT_EQ(ended({"service", "--name", "car1"}).text,
+              "pallax: the service needs --play, --simulate, --relay, --status or --list (see "
+              "pallax service --help)\n");
+}
+
+TEST(Options, CommandsAboutTheLiveModemCanNameItsService) {
+    EXPECT_EQ(parsed<RecordOptions>({"record", "--connect", "car1", "a.pcapng"}).service, "car1");
+    EXPECT_EQ(parsed<StatusOptions>({"status", "--connect", "car1"}).service, "car1");
+    EXPECT_EQ(parsed<WatchOptions>({"watch", "--connect", "car1", "1"}).service, "car1");
+    EXPECT_EQ(parsed<EventsOptions>({"events", "--live", "--connect", "car1"}).service, "car1");
+    EXPECT_EQ(parsed<SqlOptions>({"sql", "--live", "--connect", "car1", "select 1"}).service,
+              "car1");
+    const auto browsed = parsed<BrowseOptions>({"--connect", "car1"});
+    EXPECT_EQ(std::get<ServiceModem>(browsed.source).name, "car1");
+}
+
+TEST(Options, AServiceIsNamedOnlyForTheLiveModem) {
+    for (const std::vector<std::string>& arguments :
+         {std::vector<std::string>{"--connect", "car1", "a.pcap"},
+          std::vector<std::string>{"status", "--connect", "car1", "a.pcap"},
+          std::vector<std::string>{"watch", "--connect", "car1", "1", "a.pcap"},
+          std::vector<std::string>{"events", "--connect", "car1"},
+          std::vector<std::string>{"sql", "--connect", "car1", "select 1"}}) {
+        EXPECT_EQ(ended(arguments).status, kExitWrongUsage) << arguments.front();
+    }
+    EXPECT_EQ(ended({"record", "--connect", ".x", "a.pcapng"}).text,
+              std::string("pallax: --connect: \".x\"") + kRule + "record --help)\n");
+}
+
+} // namespace
+} // namespace pallax
