@@ -10,12 +10,12 @@
 
 namespace pallax {
 
-BrowseLink::BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                       StandardOutput& notices, std::string_view localPortName)
+BrowseLink::BrowseLink(AsioMainQueue& queue, SocketDirectory directory, OnFatalRecord onFatalRecord,
+                       ChildService* child, StandardOutput& notices, std::string_view localPortName)
     : _child(child), _notices(notices),
       _localPortName(child != nullptr ? child->privateName(localPortName)
                                       : std::string(localPortName)),
-      _clock(_wallClock, _queue),
+      _queue(queue), _clock(_wallClock, _queue),
       _controlPortName(child != nullptr ? child->controlPortName()
                                         : std::string(kTelephonyControlPort)),
       _socketPorts(_queue, std::move(directory), &_clock),

@@ -119,20 +119,21 @@ std::optional<std::string> recordingPath(const Source& source) {
 }
 
 std::string sourceName(const Source& source) {
-    return std::visit(
-        Visitor{[](const ServiceModem& modem) { return liveModemName(modem.name); },
-                [](const FileRecording& file) {
-                    return JoinedRecording::nameOf(file.path, file.further.size());
-                },
-                [](const StreamedRecording& stream) {
-                    const std::string path =
-                        stream.path == kStandardInput ? "standard input" : stream.path;
-                    return stream.name.empty() ? path : stream.name;
-                },
-                [](const SimulationOptions& simulation) {
-                    return "simulated " + std::string(simulation.technology->commandName);
-                }},
-        source);
+    return std::visit(Visitor{[](const ServiceModem& modem) { return liveModemName(modem.name); },
+                              [](const FileRecording& file) {
+                                  return JoinedRecording::nameOf(file.path, file.further.size());
+                              },
+                              [](const StreamedRecording& stream) {
+                                  const std::string path = stream.path == kStandardInput
+                                                               ? "standard input"
+                                                               : stream.path;
+                                  return stream.name.empty() ? path : stream.name;
+                              },
+                              [](const SimulationOptions& simulation) {
+                                  return "simulated " +
+                                         std::string(simulation.technology->commandName);
+                              }},
+                      source);
 }
 
 bool isReadOnce(const Source& source) {

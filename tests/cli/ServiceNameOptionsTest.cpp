@@ -40,6 +40,26 @@ TEST(Options, CommandsAboutTheLiveModemCanNameItsService) {
     EXPECT_EQ(std::get<ServiceModem>(browsed.source).name, "car1");
 }
 
+TEST(Options, SeveralModemsCanBeBrowsed) {
+    const auto three =
+        parsed<BrowseOptions>({"--connect", "a", "--connect", "b", "--connect", "c"});
+    EXPECT_EQ(std::get<ServiceModem>(three.source).name, "a");
+    ASSERT_EQ(three.further.size(), 2U);
+    EXPECT_EQ(three.further[0].name, "b");
+    EXPECT_EQ(three.further[1].name, "c");
+    EXPECT_TRUE(parsed<BrowseOptions>({"--connect", "a"}).further.empty());
+    EXPECT_EQ(ended({"--connect", "a", "--connect", "a"}).text,
+              "pallax: --connect: \"a\" is given twice (see pallax --help)\n");
+    std::vector<std::string> arguments;
+    for (const char* name : {"1", "2", "3", "4", "5", "6", "7", "8", "9"}) {
+        arguments.insert(arguments.end(), {"--connect", name});
+    }
+    EXPECT_EQ(parsed<BrowseOptions>(arguments).further.size(), 8U);
+    arguments.insert(arguments.end(), {"--connect", "10"});
+    EXPECT_EQ(ended(arguments).text,
+              "pallax: --connect: at most nine modems can be shown (see pallax --help)\n");
+}
+
 TEST(Options, AServiceIsNamedOnlyForTheLiveModem) {
     for (const std::vector<std::string>& arguments :
          {std::vector<std::string>{"--connect", "car1", "a.pcap"},
@@ -49,6 +69,8 @@ TEST(Options, AServiceIsNamedOnlyForTheLiveModem) {
           std::vector<std::string>{"sql", "--connect", "car1", "select 1"}}) {
         EXPECT_EQ(ended(arguments).status, kExitWrongUsage) << arguments.front();
     }
+    EXPECT_EQ(ended({"--connect", "car1", "a.pcap"}).text,
+              "pallax: RECORDING excludes --connect (see pallax --help)\n");
     EXPECT_EQ(ended({"record", "--connect", ".x", "a.pcapng"}).text,
               std::string("pallax: --connect: \".x\"") + kRule + "record --help)\n");
 }
