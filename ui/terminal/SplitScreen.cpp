@@ -134,12 +134,11 @@ void SplitScreen::choose(std::size_t number) {
 }
 
 void SplitScreen::handle(const KeyEvent& event) {
+    const bool isSplit = _modems.size() > 1;
     const bool isNext = event.key == Key::Character && event.character == controlKey('n');
-    if (_modems.size() == 1) {
-        current().handle(event);
-    } else if (isNext) {
+    if (isSplit && isNext) {
         choose((_current + 1) % _modems.size() + 1);
-    } else if (isMouse(event)) {
+    } else if (isSplit && isMouse(event)) {
         handleMouse(event);
     } else {
         current().handle(event);
