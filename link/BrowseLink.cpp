@@ -25,7 +25,9 @@ BrowseLink::BrowseLink(AsioMainQueue& queue, SocketDirectory directory, OnFatalR
                   [this] { return _socketPorts.lastError(); },
                   [this] { return _socketPorts.isTaken(_controlPortName); },
                   _socketPorts.directory().service()}),
-      _ports(_linkPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
+      _ports(
+          _linkPorts, onFatalRecord, [this] { return _clock.packetNumber(); },
+          _socketPorts.directory().service()),
       _resources(DirectoryResources::programFolder()) {}
 
 ModemLink::Platform BrowseLink::platform() {
