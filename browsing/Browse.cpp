@@ -76,16 +76,25 @@ public:
     GuardedTerminal& operator=(const GuardedTerminal&) = delete;
 };
 
-/// Like `browseInPrint`. The terminal is restored before anything else is printed.
+/// Like `browseInPrint`, with the further modems. The terminal is restored before anything else is
+/// printed.
 bool browseOnScreen(const Request& request, SocketDirectory directory, ChildService* child) {
+    std::vector<ScreenSession::Shown> shown{{std::move(directory), child, request.options.source}};
+    for (const ServiceModem& modem : request.options.further) {
+        auto further = SocketDirectory::open(modem.name);
+        if (!further) {
+            throw std::runtime_error(further.error().sentence);
+        }
+        shown.push_back({std::move(further).value(), nullptr, modem});
+    }
     KeptNotices notices(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     auto terminal = terminal::CursesTerminal::open({request.options.color, request.options.mouse});
     if (!terminal) {
         throw std::runtime_error(terminal.error().sentence);
     }
     const GuardedTerminal guard;
-    ScreenBrowser browser(std::move(directory), request.onFatalRecord, child,
-                          request.options.source, request.settings, **terminal, notices);
+    ScreenBrowser browser({request.settings, request.onFatalRecord, **terminal, notices},
+                          std::move(shown));
     return browser.run();
 }
 
@@ -172,8 +181,9 @@ ExitStatus browseWithLog(const Request& request) {
     if (const auto missing = file != nullptr ? missingParts(file->parts()) : std::nullopt) {
         complain(*missing);
     }
+    const auto* modem = std::get_if<ServiceModem>(&source);
     std::unique_ptr<ChildService> child;
-    if (!std::holds_alternative<ServiceModem>(source)) {
+    if (modem == nullptr) {
         auto started = startChild(request.options);
         if (!started) {
             complain(started.error().sentence);
@@ -181,7 +191,7 @@ ExitStatus browseWithLog(const Request& request) {
         }
         child = std::move(started).value();
     }
-    auto directory = SocketDirectory::open();
+    auto directory = SocketDirectory::open(modem != nullptr ? modem->name : "");
     if (!directory) {
         complain(directory.error().sentence);
         return kExitFailure;
@@ -206,6 +216,10 @@ ExitStatus runBrowse(const BrowseOptions& wanted) {
     const Request request{
         options, *settings, options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,
         !options.print && !options.plain && terminal::CursesTerminal::isPossible()};
+    if (!request.isOnScreen && !options.further.empty()) {
+        complain("Several modems are shown only on the screen of a terminal: give one --connect.");
+        return kExitWrongUsage;
+    }
     SyslogSink syslog("pallax");
     if (!options.logLevel) {
         const ScopedLog log(syslog, settings->systemLogLevel);

@@ -4,12 +4,17 @@
 #include "telephony/PacketPlayer.h"
 #include "ui/terminal/CursesTerminal.h"
 
+#include <cstddef>
 #include <optional>
+#include <vector>
 
 namespace pallax {
 
 struct BrowseOptions {
+    static constexpr std::size_t kMostModems = 9; ///< each has a number key
+
     Source source;
+    std::vector<ServiceModem> further = {}; ///< other modems, shown beside the source
     PlayOptions play;
     bool print = false;
     bool plain = false; ///< prints sentences instead of trees

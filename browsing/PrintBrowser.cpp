@@ -23,7 +23,7 @@ PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecor
                            ChildService* child, AfterReconnect afterReconnect, Output& output,
                            std::string source, TreePrinter::Form form)
     : _source(std::move(source)), _afterReconnect(afterReconnect), _notices(output),
-      _link(std::move(directory), onFatalRecord, child, _notices),
+      _link(_queue, std::move(directory), onFatalRecord, child, _notices),
       _printer(
           output, _link.clock(), [this] { return _model->topLevelNodes(); }, form),
       _model(makeModel()) {}

@@ -52,6 +52,7 @@ private:
     DisplayAge _displayAge;
     bool _childLost = false;
     Notices _notices;
+    AsioMainQueue _queue;
     BrowseLink _link;
     TreePrinter _printer;
     std::unique_ptr<PallaxModel> _model;

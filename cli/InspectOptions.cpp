@@ -124,7 +124,7 @@ void addSql(CLI::App& app, SqlOptions& options) {
         {{"table", RowFormat::Table}, {"csv", RowFormat::Csv}, {"json", RowFormat::Json}},
         "A table, CSV, or JSON, one object per row (default: table)");
     app.add_option("--file", options.file, "Read the query from this file")->type_name("FILE");
-    addLive(app, options.live, options.duration);
+    addLive(app, options.live, options.duration, options.service);
     app.add_option_function<std::string>(
            "--timeout",
            [&options](const std::string& text) {

@@ -1,5 +1,6 @@
 #include "cli/OptionParts.h"
 
+#include "host/ServiceName.h"
 #include "telephony/Service.h"
 #include "text/Suggestion.h"
 
@@ -41,9 +42,30 @@ CLI::Option* addTime(CLI::App& app, const std::string& name, std::optional<TimeT
     return app.add_option_function<std::string>(name, take, description)->type_name("TIME");
 }
 
-CLI::Option* addLive(CLI::App& app, bool& live, std::optional<std::chrono::nanoseconds>& duration) {
+std::string serviceNameOf(const char* option, const std::string& text) {
+    if (!isServiceName(text)) {
+        throw CLI::ValidationError(option,
+                                   "\"" + text +
+                                       "\" is no name of 1 to 32 letters, digits, \"-\", \"_\" and "
+                                       "\".\" that begins with neither \"-\" nor \".\"");
+    }
+    return text;
+}
+
+CLI::Option* addConnect(CLI::App& app, std::string& service, const std::string& description) {
+    return app
+        .add_option_function<std::string>(
+            "--connect",
+            [&service](const std::string& text) { service = serviceNameOf("--connect", text); },
+            description)
+        ->type_name("NAME");
+}
+
+CLI::Option* addLive(CLI::App& app, bool& live, std::optional<std::chrono::nanoseconds>& duration,
+                     std::string& service) {
     CLI::Option* option = app.add_flag("--live", live, "The live modem instead of recordings");
     addDuration(app, duration, "With --live: end after this many seconds")->needs(option);
+    addConnect(app, service, "With --live: the service that has this name")->needs(option);
     return option;
 }
 

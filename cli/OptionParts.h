@@ -78,8 +78,17 @@ CLI::Option* addDuration(CLI::App& app, Duration& duration, const std::string& d
     return app.add_option_function<std::string>("--for", take, description)->type_name("SECONDS");
 }
 
-/// --live, and --for SECONDS with it.
-CLI::Option* addLive(CLI::App& app, bool& live, std::optional<std::chrono::nanoseconds>& duration);
+/// The name of a service; throws if it cannot be one.
+std::string serviceNameOf(const char* option, const std::string& text);
+
+/// --connect NAME: the live modem of the service with this name.
+CLI::Option* addConnect(CLI::App& app, std::string& service,
+                        const std::string& description = "The live modem of the service that has "
+                                                         "this name");
+
+/// --live, and --for SECONDS and --connect NAME with it.
+CLI::Option* addLive(CLI::App& app, bool& live, std::optional<std::chrono::nanoseconds>& duration,
+                     std::string& service);
 
 /// --speed X|max.
 CLI::Option* addSpeed(CLI::App& app, PlayOptions& play);

@@ -19,6 +19,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax                               browse the live modem
   pallax drive.pcap --speed 4          browse a recording, four times as fast
   modem-dump | pallax -                browse what another program records
+  pallax --connect car1 --connect car2     browse two live modems side by side
   pallax demo                          browse a simulated modem
   pallax decode drive.pcap             print its last display as JSON
   pallax decode --every tick --format csv drive.pcap > drive.csv
@@ -35,6 +36,10 @@ constexpr const char* kFooter = R"(Examples:
 
 The numbered parts of a recording (drive-0001.pcapng drive-0002.pcapng) are
 browsed as one, in the order of their times.
+
+Several modems (--connect) are side by side where each has 79 columns, otherwise
+one at a time; the keys 1 to 9 and Ctrl-N move the keyboard to another one. Each
+needs a service with a name (pallax service --help).
 
 Each command has its own help (pallax decode --help). To open a recording with
 the name of a command, add its folder (pallax ./decode).
@@ -176,6 +181,34 @@ Source recordingToBrowse(const std::vector<std::string>& paths) {
     return *parts;
 }
 
+void addConnections(CLI::App& app, BrowseOptions& options, CLI::Option& recording) {
+    const auto take = [&options](const std::vector<std::string>& names) {
+        std::vector<ServiceModem> modems;
+        for (const std::string& name : names) {
+            const bool isKnown = std::any_of(modems.begin(), modems.end(),
+                                             [&](const auto& modem) { return modem.name == name; });
+            if (isKnown) {
+                throw CLI::ValidationError("--connect", "\"" + name + "\" is given twice");
+            }
+            modems.push_back({serviceNameOf("--connect", name)});
+        }
+        if (modems.size() > BrowseOptions::kMostModems) {
+            throw CLI::ValidationError("--connect", "at most nine modems can be shown");
+        }
+        options.source = modems.front();
+        options.further.assign(modems.begin() + 1, modems.end());
+    };
+    app.add_option_function<std::vector<std::string>>(
+           "--connect", take,
+           "The live modem of the service that has this name (repeat it for several modems, on one "
+           "screen)")
+        ->expected(1)
+        ->take_all()
+        ->allow_extra_args(false)
+        ->excludes(&recording)
+        ->type_name("NAME");
+}
+
 void addLogLevel(CLI::App& app, std::optional<int>& level) {
     constexpr int kHighestLevel = 7;
     app.add_option("--log-level", level,
@@ -215,6 +248,7 @@ void addBrowse(CLI::App& app, BrowseOptions& options) {
                "The recording or saved snapshot to browse (pcap or pcapng, a file or a named "
                "pipe; - is standard input; default: the live modem), or the numbered parts of one")
             ->type_name("");
+    addConnections(app, options, *recording);
     addView(app, options);
     addPlay(app, options.play, recording);
     app.footer(kFooter);
@@ -226,7 +260,7 @@ void addEvents(CLI::App& app, EventsOptions& options) {
     app.add_flag("--json", options.json, "JSON, one object per line");
     app.add_option("--where", options.where, "List only the events for which this holds")
         ->type_name("CONDITION");
-    CLI::Option* live = addLive(app, options.live, options.duration);
+    CLI::Option* live = addLive(app, options.live, options.duration, options.service);
     app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
         ->excludes(live)
         ->type_name("");
@@ -278,6 +312,7 @@ void addRecord(CLI::App& app, RecordOptions& options) {
     app.add_flag_callback(
         "--overwrite", [&options] { options.files.existing = PcapNgWriter::Existing::Overwrite; },
         "Replace existing files");
+    addConnect(app, options.service);
     addLogLevel(app, options.logLevel);
     app.footer(kRecordFooter);
 }

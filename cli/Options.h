@@ -33,12 +33,18 @@ struct ParseEnd {
 };
 
 /// `pallax service --status`.
-struct ServiceStatusOptions {};
+struct ServiceStatusOptions {
+    std::string name = {}; ///< of the service; empty: it has none
+};
+
+/// `pallax service --list`.
+struct ServiceListOptions {};
 
 using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
-                 SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions, InfoOptions,
-                 SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions, ParseEnd>;
+                 ServiceListOptions, SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions,
+                 InfoOptions, SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
+                 ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

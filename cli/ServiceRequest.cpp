@@ -13,7 +13,9 @@ constexpr const char* kServiceFooter = R"(Examples:
   pallax service --simulate lte --seed 7
   pallax service --simulate ifx --seconds 600 --speed max
   ssh phone modem-dump | pallax service --relay -
+  pallax service --name car1 --simulate lte
   pallax service --status
+  pallax service --list
 
 Each client gets its own channel. A recording or simulation restarts for each
 client; a named pipe is played once, to the first. A relayed stream goes live to
@@ -21,6 +23,10 @@ all clients, after a wait for the first one (--wait), and the service ends with
 it.
 A slow client loses packets but delays no other client; with --speed max it sets
 its own pace and loses nothing.
+
+Services with names (--name) run beside each other; pallax --connect NAME shows
+the modem of one, and commands about the live modem take --connect, too. The one
+service without a name is what they use otherwise; --list does not list it.
 
 Exit status:
   0   success: ended by Ctrl-C, or at the regular end of the relayed stream
@@ -71,12 +77,21 @@ void addServiceRelay(CLI::App& app, ServiceOptions& options) {
         ->needs("--relay");
 }
 
-void addServiceStatus(CLI::App& app, bool& status) {
-    app.add_flag("--status", status, "Print the status of the running service and exit")
+/// A flag that prints something instead of running the service.
+CLI::Option* addPrinting(CLI::App& app, const char* name, bool& flag, const char* description) {
+    return app.add_flag(name, flag, description)
         ->excludes("--play")
         ->excludes("--speed")
         ->excludes("--simulate")
         ->excludes("--relay");
+}
+
+void addServiceName(CLI::App& app, std::string& name) {
+    app.add_option_function<std::string>(
+           "--name", [&name](const std::string& text) { name = serviceNameOf("--name", text); },
+           "The service's name, to which --connect refers; several services can run if at most one "
+           "has no name")
+        ->type_name("NAME");
 }
 
 } // namespace
@@ -85,17 +100,26 @@ void addService(CLI::App& app, ServiceRequest& request) {
     addServicePlay(app, request.options);
     addServiceSimulation(app, request.options.source)->excludes("--play");
     addServiceRelay(app, request.options);
-    addServiceStatus(app, request.status);
+    addServiceName(app, request.options.name);
+    addPrinting(app, "--status", request.status,
+                "Print the status of the running service and exit");
+    addPrinting(app, "--list", request.list, "List the names of running services and exit")
+        ->excludes("--name")
+        ->excludes("--status");
     app.footer(kServiceFooter);
 }
 
 ParsedOptions serviceOptions(const ServiceRequest& request) {
     if (request.status) {
-        return ServiceStatusOptions();
+        return ServiceStatusOptions{request.options.name};
+    }
+    if (request.list) {
+        return ServiceListOptions();
     }
     const Source& source = request.options.source;
     if (std::holds_alternative<ServiceModem>(source) || recordingPath(source) == "") {
-        return wrongUsage("the service needs --play, --simulate, --relay or --status", "service");
+        return wrongUsage("the service needs --play, --simulate, --relay, --status or --list",
+                          "service");
     }
     return request.options;
 }

@@ -6,10 +6,12 @@
 
 namespace pallax {
 
-/// What the service should do: play, simulate, relay or print its status, exactly one of them.
+/// What the service should do: play, simulate, relay, print its status or list those that run,
+/// exactly one of them.
 struct ServiceRequest {
     ServiceOptions options;
     bool status = false;
+    bool list = false;
 };
 
 void addService(CLI::App& app, ServiceRequest& request);

@@ -85,6 +85,7 @@ void addStatus(CLI::App& app, StatusOptions& options) {
     at->needs(recording);
     addDuration(app, options.duration, "Receive the live modem for so long (default: 5)")
         ->excludes(recording);
+    addConnect(app, options.service)->excludes(recording);
     app.footer(kStatusFooter);
 }
 

@@ -96,8 +96,10 @@ void addWatch(CLI::App& app, WatchOptions& options) {
     CLI::Option* condition = app.add_option("CONDITION", options.condition, "The condition");
     condition->required()->type_name("");
     addRule(app, options, *condition);
+    CLI::Option* connect = addConnect(app, options.service);
     app.add_option("RECORDING", options.recordings,
                    "Recordings (pcap or pcapng; - is standard input; default: the live modem)")
+        ->excludes(connect)
         ->type_name("");
     app.footer(kWatchFooter);
 }

@@ -28,8 +28,11 @@ struct Run {
     ExitStatus operator()(const ServiceOptions& options) const {
         return runService(options) == 0 ? kExitSuccess : kExitFailure;
     }
-    ExitStatus operator()(const ServiceStatusOptions& /*options*/) const {
-        return printServiceStatus() == 0 ? kExitSuccess : kExitFailure;
+    ExitStatus operator()(const ServiceStatusOptions& options) const {
+        return printServiceStatus(options.name) == 0 ? kExitSuccess : kExitFailure;
+    }
+    ExitStatus operator()(const ServiceListOptions& /*options*/) const {
+        return printServiceList() == 0 ? kExitSuccess : kExitFailure;
     }
     ExitStatus operator()(const SimulateOptions& options) const { return runSimulate(options); }
     ExitStatus operator()(const EventsOptions& options) const {

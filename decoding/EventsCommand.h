@@ -24,6 +24,7 @@ struct EventsOptions {
     std::optional<std::string> where = {}; ///< condition on the events to write
     bool live = false;                     ///< of the live modem, without recordings
     std::optional<std::chrono::nanoseconds> duration = {}; ///< live; if missing, until a signal
+    std::string service = {}; ///< of the live modem; empty: the one without a name
 };
 
 /// Writes a line for each event of the recordings, in the order of the command line: local time,

@@ -45,7 +45,8 @@ MessagePorts::Local GuardedMessagePorts::createLocal(std::string_view name,
 }
 
 void GuardedMessagePorts::failed(std::uint64_t packet, Bytes data, std::string_view reason) const {
-    const std::string sentence = fatalRecordSentence(packet, data, reason);
+    const std::string sentence =
+        (_modem.empty() ? "" : _modem + ": ") + fatalRecordSentence(packet, data, reason);
     if (_onFatalRecord == OnFatalRecord::Stop) {
         throw FatalRecord(sentence);
     }

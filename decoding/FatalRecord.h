@@ -40,9 +40,11 @@ public:
     /// The number of the current packet in its source, or 0.
     using PacketNumber = std::function<std::uint32_t()>;
 
+    /// `modem` begins the sentences, unless it is empty.
     GuardedMessagePorts(MessagePorts& ports, OnFatalRecord onFatalRecord,
-                        PacketNumber packetNumber = {})
-        : _ports(ports), _onFatalRecord(onFatalRecord), _packetNumber(std::move(packetNumber)) {}
+                        PacketNumber packetNumber = {}, std::string modem = {})
+        : _ports(ports), _onFatalRecord(onFatalRecord), _packetNumber(std::move(packetNumber)),
+          _modem(std::move(modem)) {}
 
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override {
@@ -55,6 +57,7 @@ private:
     MessagePorts& _ports;
     OnFatalRecord _onFatalRecord;
     PacketNumber _packetNumber;
+    std::string _modem;
     std::uint64_t _packets = 0;
 };
 

@@ -1,15 +1,18 @@
 #include "host/SocketDirectory.h"
 
 #include "host/FileName.h"
+#include "host/ServiceName.h"
 #include "host/UnixSocket.h"
 #include "text/Format.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <chrono>
 #include <cstdlib>
 #include <cstring>
 #include <fcntl.h>
 #include <filesystem>
+#include <optional>
 #include <sys/file.h>
 #include <sys/stat.h>
 #include <thread>
@@ -19,6 +22,7 @@ namespace pallax {
 namespace {
 
 constexpr std::chrono::milliseconds kLockLook{5};
+constexpr const char* kServices = "/services";
 
 std::string placeOfDirectory() {
     const char* runtime = std::getenv("XDG_RUNTIME_DIR"); // NOLINT(concurrency-mt-unsafe)
@@ -32,10 +36,8 @@ HostError refusal(const std::string& path, std::string_view why) {
     return {formatText("The folder for message ports, %@, %@.", {path, why})};
 }
 
-} // namespace
-
-Result<SocketDirectory, HostError> SocketDirectory::open() {
-    const std::string path = placeOfDirectory();
+/// Makes a folder unless it exists, and says why it cannot be used.
+std::optional<HostError> makePrivate(const std::string& path) {
     if (::mkdir(path.c_str(), S_IRWXU) != 0 && errno != EEXIST) {
         return refusal(path, formatText("cannot be made: %@", {std::strerror(errno)}));
     }
@@ -55,7 +57,40 @@ Result<SocketDirectory, HostError> SocketDirectory::open() {
     if ((status.st_mode & (S_IRWXG | S_IRWXO)) != 0) {
         return refusal(path, "can be entered by other users (its mode must be 0700)");
     }
-    return SocketDirectory(path);
+    return std::nullopt;
+}
+
+} // namespace
+
+Result<SocketDirectory, HostError> SocketDirectory::open(std::string_view service) {
+    std::vector<std::string> folders{placeOfDirectory()};
+    if (!service.empty()) {
+        folders.push_back(folders.back() + kServices);
+        folders.push_back(folders.back() + '/' + std::string(service));
+        if (!isServiceName(service)) {
+            return refusal(folders.back(), "is not the folder of a service");
+        }
+    }
+    for (const std::string& folder : folders) {
+        if (const auto refused = makePrivate(folder)) {
+            return *refused;
+        }
+    }
+    return SocketDirectory(folders.back(), service);
+}
+
+std::vector<std::string> SocketDirectory::services() {
+    std::vector<std::string> names;
+    std::error_code error;
+    for (const auto& entry :
+         std::filesystem::directory_iterator(placeOfDirectory() + kServices, error)) {
+        std::string name = entry.path().filename().native();
+        if (isServiceName(name) && entry.is_directory(error)) {
+            names.push_back(std::move(name));
+        }
+    }
+    std::sort(names.begin(), names.end());
+    return names;
 }
 
 Result<std::string, HostError> SocketDirectory::socketPath(std::string_view name) const {

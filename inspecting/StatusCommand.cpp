@@ -77,7 +77,10 @@ namespace {
 /// Receives the live modem and shows it. Ctrl-C ends the reception early.
 ExitStatus showLive(const StatusOptions& options, const Settings& settings, StatusCommand& command,
                     Output& output) {
-    LiveSession session({settings, options.technology, options.duration});
+    LiveSession session({.settings = settings,
+                         .wanted = options.technology,
+                         .duration = options.duration,
+                         .service = options.service});
     std::optional<std::string> failure;
     {
         const Interruption interruption;

@@ -33,6 +33,7 @@ struct StatusOptions {
     std::optional<TimeText> at; ///< nothing: the end
     std::string profile{kDefaultProfile};
     bool json = false;
+    std::string service = {}; ///< of the live modem; empty: the one without a name
 };
 
 class StatusCommand {

@@ -1,5 +1,6 @@
 #include "inspecting/ViewedFile.h"
 
+#include "host/ServiceName.h"
 #include "host/Snapshot.h"
 #include "live/LiveSession.h"
 #include "overview/DisplayValues.h"
@@ -52,10 +53,10 @@ ViewedFile::open(const std::string& path, const RecordedTechnology* technology,
 
 Result<std::unique_ptr<ViewedFile>, NotSeen> ViewedFile::of(LiveSession& session) {
     if (session.timeline() == nullptr) {
-        return NotSeen{std::string(LiveSession::kNoPacket)};
+        return NotSeen{noPacketText(session.service())};
     }
     std::unique_ptr<ViewedFile> file(new ViewedFile);
-    file->_name = "live modem";
+    file->_name = liveModemName(session.service());
     file->_timeline = session.timeline();
     file->_technology = technologyOfCommandName(file->_timeline->fields().technology());
     file->_notes = session.notes();

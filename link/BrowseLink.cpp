@@ -10,12 +10,12 @@
 
 namespace pallax {
 
-BrowseLink::BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                       StandardOutput& notices, std::string_view localPortName)
+BrowseLink::BrowseLink(AsioMainQueue& queue, SocketDirectory directory, OnFatalRecord onFatalRecord,
+                       ChildService* child, StandardOutput& notices, std::string_view localPortName)
     : _child(child), _notices(notices),
       _localPortName(child != nullptr ? child->privateName(localPortName)
                                       : std::string(localPortName)),
-      _clock(_wallClock, _queue),
+      _queue(queue), _clock(_wallClock, _queue),
       _controlPortName(child != nullptr ? child->controlPortName()
                                         : std::string(kTelephonyControlPort)),
       _socketPorts(_queue, std::move(directory), &_clock),
@@ -23,8 +23,11 @@ BrowseLink::BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, C
       _linkPorts({_socketPorts, _telephony,
                   formatText("%@.Viewer.%d", {ModemLink::kLocalPortName, ::getpid()}),
                   [this] { return _socketPorts.lastError(); },
-                  [this] { return _socketPorts.isTaken(_controlPortName); }}),
-      _ports(_linkPorts, onFatalRecord, [this] { return _clock.packetNumber(); }),
+                  [this] { return _socketPorts.isTaken(_controlPortName); },
+                  _socketPorts.directory().service()}),
+      _ports(
+          _linkPorts, onFatalRecord, [this] { return _clock.packetNumber(); },
+          _socketPorts.directory().service()),
       _resources(DirectoryResources::programFolder()) {}
 
 ModemLink::Platform BrowseLink::platform() {

@@ -21,8 +21,9 @@ namespace pallax {
 class ChildService;
 class StandardOutput;
 
-/// The parts of this machine that a model needs to browse: the main queue, the ports to the
-/// telephony service (a child's or the machine's), the source's clock, and the templates.
+/// The parts of this machine that a model needs to browse: the ports to the telephony service (a
+/// child's or the machine's), the source's clock, and the templates, all on a main queue, which
+/// several links can share.
 class BrowseLink {
 public:
     /// How often a browser checks the connection, and whether the child service is still running.
@@ -31,8 +32,9 @@ public:
     /// `child` is null for the machine's own service; a child's clients have private port names,
     /// made from `localPortName`. If that name is taken, the link has another one for this process
     /// (see LinkPorts). References must outlive the link.
-    BrowseLink(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-               StandardOutput& notices, std::string_view localPortName = ModemLink::kLocalPortName);
+    BrowseLink(AsioMainQueue& queue, SocketDirectory directory, OnFatalRecord onFatalRecord,
+               ChildService* child, StandardOutput& notices,
+               std::string_view localPortName = ModemLink::kLocalPortName);
 
     AsioMainQueue& queue() { return _queue; }
     SourceClock& clock() { return _clock; }
@@ -55,7 +57,7 @@ private:
     ChildService* _child;
     StandardOutput& _notices;
     std::string _localPortName;
-    AsioMainQueue _queue;
+    AsioMainQueue& _queue;
     WallClock _wallClock;
     SourceClock _clock;
     std::string _controlPortName;

@@ -1,6 +1,7 @@
 #include "link/LinkPorts.h"
 
 #include "telephony/ControlMessages.h"
+#include "telephony/NamedServices.h"
 #include "text/Format.h"
 
 #include <cerrno>
@@ -11,7 +12,6 @@ namespace pallax {
 
 namespace {
 
-constexpr const char* kNoService = "No telephony service is running";
 constexpr const char* kNoAnswer = "The telephony service does not answer";
 constexpr const char* kBusy = "The telephony service is busy with other clients";
 constexpr const char* kNothingToPlay = "The telephony service has nothing to play to this client";
@@ -65,6 +65,9 @@ private:
     LinkPorts& _link;
 };
 
+LinkPorts::LinkPorts(Setup setup)
+    : _setup(std::move(setup)), _noService(noServiceText(_setup.serviceName)) {}
+
 MessagePorts::Local LinkPorts::createLocal(std::string_view name, ReceiveCallback callback) {
     ReceiveCallback receive = [this, callback = std::move(callback)](std::int32_t identifier,
                                                                      Bytes data) {
@@ -86,9 +89,11 @@ MessagePorts::Local LinkPorts::createLocal(std::string_view name, ReceiveCallbac
 }
 
 std::string_view LinkPorts::briefObstacle() const {
+    if (_obstacle == _noService) {
+        return "no service";
+    }
     constexpr std::pair<std::string_view, std::string_view> kBrief[] = {
         {"", ""},
-        {kNoService, "no service"},
         {kNoAnswer, "no answer"},
         {kBusy, "service is busy"},
         {kNothingToPlay, "nothing to play"},
@@ -105,7 +110,7 @@ std::string_view LinkPorts::briefObstacle() const {
 std::unique_ptr<HXServerConnection> LinkPorts::connect(std::function<void()> notification) {
     auto connection = _setup.telephony.connect(std::move(notification));
     if (connection == nullptr) {
-        _obstacle = _setup.isServiceThere() ? kNoAnswer : kNoService;
+        _obstacle = _setup.isServiceThere() ? kNoAnswer : _noService;
         return nullptr;
     }
     _obstacle = kNoAnswer;

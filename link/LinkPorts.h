@@ -25,10 +25,11 @@ public:
         std::function<std::string()> whyNoPort;
         /// Whether there is a service, even one that accepts no connection now.
         std::function<bool()> isServiceThere;
+        std::string serviceName = {}; ///< empty: the service has none
     };
 
     /// The references in the setup must outlive the ports.
-    explicit LinkPorts(Setup setup) : _setup(std::move(setup)) {}
+    explicit LinkPorts(Setup setup);
 
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override;
@@ -46,6 +47,7 @@ private:
     class Connection;
 
     Setup _setup;
+    std::string _noService; ///< an obstacle
     std::string _localName; ///< in place of the model's
     std::string _obstacle;
     std::uint64_t _received = 0;

@@ -30,8 +30,8 @@ const RecordedTechnology* technologyOf(const PropertyList& answer) {
 } // namespace
 
 PacketReceiver::PacketReceiver(Setup setup)
-    : _setup(std::move(setup)), _link(std::move(_setup.directory), OnFatalRecord::Skip, nullptr,
-                                      _notices, receivingPortName(_setup.program)),
+    : _setup(std::move(setup)), _link(_queue, std::move(_setup.directory), OnFatalRecord::Skip,
+                                      nullptr, _notices, receivingPortName(_setup.program)),
       _modem(platform(), *this) {}
 
 ModemLink::Platform PacketReceiver::platform() {

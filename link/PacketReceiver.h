@@ -71,6 +71,7 @@ private:
     bool _isOver = false;
     std::optional<std::string> _failure;
     NoNotices _notices;
+    AsioMainQueue _queue;
     BrowseLink _link;
     std::unique_ptr<LogGenerator> _generator; // only for its start command
     ModemLink _modem;

@@ -6,6 +6,7 @@
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/LogSinks.h"
+#include "host/ServiceName.h"
 #include "link/Settings.h"
 #include "link/WaitNotice.h"
 #include "live/LiveRecording.h"
@@ -30,9 +31,10 @@ ExitStatus runLiveEvents(EventsOptions options) {
     }
     SyslogSink syslog("pallax");
     const ScopedLog log(syslog, settings->systemLogLevel);
-    options.recordings = {"live modem"};
+    options.recordings = {liveModemName(options.service)};
     return runEvents(options, [&options](const std::string& /*name*/) {
-        return LiveRecording::open({options.technology, options.duration, complainOfWaiting});
+        return LiveRecording::open(
+            {options.technology, options.duration, complainOfWaiting, options.service});
     });
 }
 

@@ -1,5 +1,6 @@
 #include "live/LiveRecording.h"
 
+#include "host/ServiceName.h"
 #include "live/LiveSession.h"
 #include "platform/RecordedTechnology.h"
 #include "text/Format.h"
@@ -10,7 +11,7 @@ namespace pallax {
 
 Recording::OpenResult LiveRecording::open(const Setup& setup) {
     using Kind = RecordingError::Kind;
-    auto directory = SocketDirectory::open();
+    auto directory = SocketDirectory::open(setup.service);
     if (!directory) {
         return RecordingError{Kind::CannotOpen, directory.error().sentence};
     }
@@ -20,13 +21,14 @@ Recording::OpenResult LiveRecording::open(const Setup& setup) {
         return *made->_error;
     }
     if (!made->_stamp) {
-        return RecordingError{Kind::Empty, std::string(LiveSession::kNoPacket)};
+        return RecordingError{Kind::Empty, noPacketText(setup.service)};
     }
     return std::unique_ptr<Recording>(std::move(made));
 }
 
 LiveRecording::LiveRecording(SocketDirectory directory, const Setup& setup)
-    : _receiver({std::move(directory), "Reader", setup.wanted,
+    : _name(liveModemName(setup.service)),
+      _receiver({std::move(directory), "Reader", setup.wanted,
                  [this](const RecordedTechnology& technology, Time stamp, Bytes packet) {
                      take(technology, stamp, packet);
                  },

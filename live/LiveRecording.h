@@ -18,6 +18,7 @@ public:
         const RecordedTechnology* wanted = nullptr; ///< as for PacketReceiver
         std::optional<std::chrono::nanoseconds> duration = {};
         std::function<void(const std::string& text)> waits; ///< receives the texts of WaitNotice
+        std::string service = {}; ///< its name; empty: the one without a name
     };
 
     /// Waits for the first packet. An error if there is none.
@@ -37,7 +38,7 @@ private:
     void receive();
     void take(const RecordedTechnology& technology, Time stamp, Bytes packet);
 
-    std::string _name = "live modem";
+    std::string _name;
     const RecordedTechnology* _technology = nullptr;
     std::optional<Time> _stamp; ///< of the packet that is to be given next
     ByteBuffer _packet;

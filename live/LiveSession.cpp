@@ -6,16 +6,22 @@
 #include "host/LogSinks.h"
 #include "link/PacketReceiver.h"
 #include "link/WaitNotice.h"
+#include "text/Format.h"
 
 #include <utility>
 
 namespace pallax {
 
+std::string noPacketText(const std::string& service) {
+    return service.empty() ? "No packet has come from the live modem."
+                           : formatText("No packet has come from %@.", {service});
+}
+
 LiveSession::LiveSession(Setup setup)
     : _setup(std::move(setup)), _resources(DirectoryResources::programFolder()) {}
 
 std::optional<std::string> LiveSession::run() {
-    auto directory = SocketDirectory::open();
+    auto directory = SocketDirectory::open(_setup.service);
     if (!directory) {
         return directory.error().sentence;
     }

@@ -11,21 +11,23 @@
 #include <memory>
 #include <optional>
 #include <string>
-#include <string_view>
 #include <vector>
 
 namespace pallax {
 
+/// That no packet has come from the live modem, or from the one of the service with this name: one
+/// sentence.
+std::string noPacketText(const std::string& service);
+
 /// The live channel of this machine as a timeline.
 class LiveSession {
 public:
-    static constexpr std::string_view kNoPacket = "No packet has come from the live modem.";
-
     struct Setup {
         const Settings& settings;
         const RecordedTechnology* wanted = nullptr; ///< as for PacketReceiver
         std::optional<std::chrono::nanoseconds> duration = {};
         std::function<void(Timeline& timeline)> indexed = [](Timeline&) {}; ///< as for LiveTimeline
+        std::string service = {}; ///< its name; empty: the one without a name
     };
 
     /// The settings must outlive the session.
@@ -36,6 +38,7 @@ public:
     /// TemplateFailure and exceptions of the functions pass through. Call it once.
     std::optional<std::string> run();
 
+    const std::string& service() const { return _setup.service; }
     /// Null if no packet has come.
     Timeline* timeline() { return _timeline ? _timeline->timeline() : nullptr; }
     /// Sentences about what is missing; empty if all is well.

@@ -208,7 +208,8 @@ ExitStatus askRecordings(const SqlOptions& options, const Settings& settings,
 ExitStatus askLive(const SqlOptions& options, const Settings& settings, const Question& question) {
     Waiting waiting;
     LiveSession session({settings, options.technology, options.duration,
-                         [&waiting](Timeline& timeline) { waiting.reading(timeline.packets()); }});
+                         [&waiting](Timeline& timeline) { waiting.reading(timeline.packets()); },
+                         options.service});
     std::optional<std::string> failure;
     {
         const Interruption interruption;
@@ -217,7 +218,7 @@ ExitStatus askLive(const SqlOptions& options, const Settings& settings, const Qu
     waiting.end();
     Timeline* timeline = session.timeline();
     if (!failure && timeline == nullptr) {
-        failure = LiveSession::kNoPacket;
+        failure = noPacketText(options.service);
     }
     if (failure) {
         complain(*failure);

@@ -22,6 +22,7 @@ struct SqlOptions {
     const RecordedTechnology* technology = nullptr;       ///< overrides the link type
     bool live = false; ///< about the live modem, without recordings
     std::optional<std::chrono::nanoseconds> duration = {}; ///< live; if missing, until a signal
+    std::string service = {}; ///< of the live modem; empty: the one without a name
 };
 
 /// Opens the recordings, runs the query and writes its rows to standard output; without a query,

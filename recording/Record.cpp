@@ -22,7 +22,7 @@ namespace {
 constexpr int kNothing = -1;
 
 ExitStatus record(const RecordOptions& options) {
-    auto directory = SocketDirectory::open();
+    auto directory = SocketDirectory::open(options.service);
     if (!directory) {
         complain(directory.error().sentence);
         return kExitFailure;

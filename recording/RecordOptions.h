@@ -3,6 +3,7 @@
 #include "recording/RecordingFiles.h"
 
 #include <optional>
+#include <string>
 
 namespace pallax {
 
@@ -13,6 +14,7 @@ struct RecordOptions {
     /// What the modem must speak; null: whatever it answers.
     const RecordedTechnology* technology = nullptr;
     std::optional<int> logLevel; ///< system-log lines up to it go to standard error
+    std::string service = {};    ///< of the live modem; empty: the one without a name
 };
 
 } // namespace pallax

@@ -4,6 +4,7 @@
 #include "host/Recording.h"
 #include "host/RecordingFile.h"
 #include "host/RecordingParts.h"
+#include "host/ServiceName.h"
 
 #include <charconv>
 #include <map>
@@ -118,20 +119,21 @@ std::optional<std::string> recordingPath(const Source& source) {
 }
 
 std::string sourceName(const Source& source) {
-    return std::visit(
-        Visitor{[](const ServiceModem& /*modem*/) { return std::string("live modem"); },
-                [](const FileRecording& file) {
-                    return JoinedRecording::nameOf(file.path, file.further.size());
-                },
-                [](const StreamedRecording& stream) {
-                    const std::string path =
-                        stream.path == kStandardInput ? "standard input" : stream.path;
-                    return stream.name.empty() ? path : stream.name;
-                },
-                [](const SimulationOptions& simulation) {
-                    return "simulated " + std::string(simulation.technology->commandName);
-                }},
-        source);
+    return std::visit(Visitor{[](const ServiceModem& modem) { return liveModemName(modem.name); },
+                              [](const FileRecording& file) {
+                                  return JoinedRecording::nameOf(file.path, file.further.size());
+                              },
+                              [](const StreamedRecording& stream) {
+                                  const std::string path = stream.path == kStandardInput
+                                                               ? "standard input"
+                                                               : stream.path;
+                                  return stream.name.empty() ? path : stream.name;
+                              },
+                              [](const SimulationOptions& simulation) {
+                                  return "simulated " +
+                                         std::string(simulation.technology->commandName);
+                              }},
+                      source);
 }
 
 bool isReadOnce(const Source& source) {
@@ -141,7 +143,10 @@ bool isReadOnce(const Source& source) {
 std::vector<std::string> argumentsOf(const Source& source) {
     using Arguments = std::vector<std::string>;
     return std::visit(
-        Visitor{[](const ServiceModem& /*modem*/) { return Arguments{std::string(kService)}; },
+        Visitor{[](const ServiceModem& modem) {
+                    return modem.name.empty() ? Arguments{std::string(kService)}
+                                              : Arguments{std::string(kService), modem.name};
+                },
                 [](const FileRecording& file) {
                     Arguments arguments = file.parts();
                     arguments.insert(arguments.begin(), std::string(kFile));
@@ -168,6 +173,9 @@ std::optional<Source> sourceOf(std::span<const std::string> arguments) {
     const std::string_view kind = count > 0 ? std::string_view(arguments[0]) : "";
     if (kind == kService && count == 1) {
         return ServiceModem();
+    }
+    if (kind == kService && count == 2 && isServiceName(arguments[1])) {
+        return ServiceModem{arguments[1]};
     }
     if (kind == kFile && count >= 2) {
         return FileRecording{arguments[1], {arguments.begin() + 2, arguments.end()}};

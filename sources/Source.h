@@ -10,8 +10,10 @@
 
 namespace pallax {
 
-/// The modem behind this machine's telephony service.
-struct ServiceModem {};
+/// The modem behind a telephony service of this machine.
+struct ServiceModem {
+    std::string name = {}; ///< of the service; empty: the one without a name
+};
 
 /// A recording in a file, or in numbered parts, which each reader reads from its start.
 struct FileRecording {
@@ -38,7 +40,7 @@ std::optional<Source> recordingInParts(const std::vector<std::string>& paths);
 
 /// The path of a recording, or of its first part; nothing for a modem.
 std::optional<std::string> recordingPath(const Source& source);
-/// "drive.pcap", "standard input", "live modem", "simulated lte".
+/// "drive.pcap", "standard input", "live modem" or the name of its service, "simulated lte".
 std::string sourceName(const Source& source);
 bool isReadOnce(const Source& source);
 

@@ -5,6 +5,7 @@
 #include "host/Interruption.h"
 #include "host/SocketMessagePorts.h"
 #include "sources/SourceFactory.h"
+#include "telephony/NamedServices.h"
 #include "telephony/ServiceStatus.h"
 #include "telephony/TelephonyServer.h"
 
@@ -107,6 +108,17 @@ int serve(const ServiceOptions& options, const std::function<void()>& ready,
     return status;
 }
 
+/// Prints on standard output.
+int print(const std::string& text) {
+    const bool isPrinted =
+        std::fwrite(text.data(), 1, text.size(), stdout) == text.size() && std::fflush(stdout) == 0;
+    if (isPrinted || errno == EPIPE) { // a reader that has gone has seen enough
+        return 0;
+    }
+    complain("Standard output cannot be written.");
+    return 1;
+}
+
 } // namespace
 
 std::string speedText(double speed) {
@@ -131,7 +143,7 @@ std::optional<double> parseSpeed(const std::string& text) {
 }
 
 int runService(const ServiceOptions& options, const std::function<void()>& ready) {
-    auto directory = SocketDirectory::open();
+    auto directory = SocketDirectory::open(options.name);
     if (!directory) {
         complain(directory.error().sentence);
         return 1;
@@ -139,8 +151,8 @@ int runService(const ServiceOptions& options, const std::function<void()>& ready
     return serve(options, ready, std::move(directory).value());
 }
 
-int printServiceStatus() {
-    auto directory = SocketDirectory::open();
+int printServiceStatus(const std::string& name) {
+    auto directory = SocketDirectory::open(name);
     if (!directory) {
         complain(directory.error().sentence);
         return 1;
@@ -152,14 +164,15 @@ int printServiceStatus() {
         complain(status.error().sentence);
         return 1;
     }
-    const std::string text = statusText(*status);
-    const bool isPrinted =
-        std::fwrite(text.data(), 1, text.size(), stdout) == text.size() && std::fflush(stdout) == 0;
-    if (isPrinted || errno == EPIPE) { // a reader that has gone has seen enough
-        return 0;
+    return print(statusText(*status));
+}
+
+int printServiceList() {
+    std::string text;
+    for (const std::string& name : runningServices()) {
+        text += name + '\n';
     }
-    complain("Standard output cannot be written.");
-    return 1;
+    return print(text);
 }
 
 } // namespace pallax

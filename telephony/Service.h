@@ -25,6 +25,7 @@ struct ServiceOptions {
     std::chrono::nanoseconds relayPatience = kRelayPatience;
     /// Every client sets its own pace and loses nothing, at any speed.
     bool lossless = false;
+    std::string name = {}; ///< empty: it has none
 };
 
 /// "1.5", "max": a speed as in the options.
@@ -37,8 +38,11 @@ std::optional<double> parseSpeed(const std::string& text);
 /// once clients can connect.
 int runService(const ServiceOptions& options, const std::function<void()>& ready = {});
 
-/// Prints the status of the running service. Without one, prints a sentence on standard error and
-/// returns 1.
-int printServiceStatus();
+/// Prints the status of the running service with this name, or of the one without a name. If there
+/// is none, prints a sentence on standard error and returns 1.
+int printServiceStatus(const std::string& name);
+/// Prints the names of the running services that have one, a line each. On failure, prints a
+/// sentence on standard error and returns 1.
+int printServiceList();
 
 } // namespace pallax

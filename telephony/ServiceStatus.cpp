@@ -2,6 +2,7 @@
 
 #include "host/SocketMessagePorts.h"
 #include "telephony/ControlMessages.h"
+#include "telephony/NamedServices.h"
 #include "text/Format.h"
 #include "text/Printable.h"
 
@@ -87,8 +88,9 @@ Result<ServiceStatus, HostError> askStatus(SocketMessagePorts& ports,
     constexpr const char* kSilent = "The telephony service does not answer.";
     const auto port = ports.createRemote(controlPortName);
     if (port == nullptr) {
-        return HostError{ports.isTaken(controlPortName) ? kSilent
-                                                        : "No telephony service is running."};
+        return HostError{ports.isTaken(controlPortName)
+                             ? kSilent
+                             : noServiceText(ports.directory().service()) + "."};
     }
     const auto request = encodeMessage(statusRequest());
     const auto outcome = port->sendRequest({0, *request, kSendTimeout, kReplyTimeout, true});

@@ -29,8 +29,9 @@ Result<std::unique_ptr<TelephonyServer>, HostError> TelephonyServer::start(Setup
         return HostError{kept.ports.lastError()};
     }
     if (local.alreadyExisted) {
-        return HostError{
-            formatText("A telephony service named %@ is already running.", {kept.controlPortName})};
+        const std::string& service = kept.ports.directory().service();
+        return HostError{formatText("A telephony service named %@ is already running.",
+                                    {service.empty() ? kept.controlPortName : service})};
     }
     local.port->setDispatchQueue(kept.queue);
     server->_control = std::move(local.port);

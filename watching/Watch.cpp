@@ -9,6 +9,7 @@
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/LogSinks.h"
+#include "host/ServiceName.h"
 #include "host/WallClock.h"
 #include "link/Settings.h"
 #include "link/WaitNotice.h"
@@ -65,9 +66,9 @@ ExitStatus watchLive(WatchOptions options) {
     }
     SyslogSink syslog("pallax");
     const ScopedLog log(syslog, settings->systemLogLevel);
-    options.recordings = {"live modem"};
+    options.recordings = {liveModemName(options.service)};
     const auto open = [&options](const std::string& /*name*/) {
-        return LiveRecording::open({options.technology, {}, complainOfWaiting});
+        return LiveRecording::open({options.technology, {}, complainOfWaiting, options.service});
     };
     return watchWith(options, open, ShellCommand::Mode::Beside);
 }

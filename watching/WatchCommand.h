@@ -26,6 +26,7 @@ struct WatchOptions {
     std::optional<std::string> command = {};
     bool once = false;                    ///< ends when it has become true
     std::optional<std::string> rule = {}; ///< the name of an alarm, in place of the condition
+    std::string service = {};             ///< of the live modem; empty: the one without a name
 };
 
 /// Writes a line each time the condition becomes true at a tick, and one when it ends. The numbered

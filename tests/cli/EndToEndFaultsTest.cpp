@@ -93,7 +93,8 @@ private:
 
     int _updates = 0;
     doubles::FakeStandardOutput _notices;
-    BrowseLink _link{directory(), OnFatalRecord::Stop, nullptr, _notices};
+    AsioMainQueue _queue;
+    BrowseLink _link{_queue, directory(), OnFatalRecord::Stop, nullptr, _notices};
     QuickTimers _timers{_link.queue()};
     PallaxModel _model;
 };

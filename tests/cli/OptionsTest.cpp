@@ -203,12 +203,14 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
               "pallax: --seconds requires --simulate (see pallax service --help)\n");
     EXPECT_EQ(sentence({"service", "--relay", "-", "--speed", "2"}),
               "pallax: --speed excludes --relay (see pallax service --help)\n");
-    EXPECT_EQ(sentence({"service", "--play", ""}),
-              "pallax: the service needs --play, --simulate, --relay or --status (see pallax "
-              "service --help)\n");
-    EXPECT_EQ(sentence({"service", "--speed", "2"}),
-              "pallax: the service needs --play, --simulate, --relay or --status (see pallax "
-              "service --help)\n");
+    EXPECT_EQ(
+        sentence({"service", "--play", ""}),
+        "pallax: the service needs --play, --simulate, --relay, --status or --list (see pallax "
+        "service --help)\n");
+    EXPECT_EQ(
+        sentence({"service", "--speed", "2"}),
+        "pallax: the service needs --play, --simulate, --relay, --status or --list (see pallax "
+        "service --help)\n");
 }
 
 TEST(Options, FieldsAreOfEveryTechnologyUnlessOneIsNamed) {
@@ -295,8 +297,9 @@ TEST(Options, WrongUsageIsOneClearSentence) {
     EXPECT_EQ(wrongUsage({"--speed", "0", "a"}),
               "pallax: --speed: \"0\" is neither a number above 0 nor max (see pallax --help)\n");
     EXPECT_EQ(wrongUsage({"decode"}), "pallax: RECORDING is required (see pallax decode --help)\n");
-    EXPECT_EQ(wrongUsage({"service"}), "pallax: the service needs --play, --simulate, --relay or "
-                                       "--status (see pallax service --help)\n");
+    EXPECT_EQ(wrongUsage({"service"}),
+              "pallax: the service needs --play, --simulate, --relay, --status or "
+              "--list (see pallax service --help)\n");
     EXPECT_EQ(wrongUsage({"a", "decode", "b"}), "pallax: the command \"decode\" must come first, "
                                                 "without options before it (see pallax --help)\n");
     EXPECT_EQ(wrongUsage({"--print", "decode", "b"}),

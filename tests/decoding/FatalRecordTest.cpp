@@ -39,8 +39,9 @@ TEST(FatalRecord, WhatIsNoLogRecordHasNoLogCode) {
 
 class GuardedMessagePortsTest : public testing::Test {
 protected:
-    void open(OnFatalRecord onFatalRecord) {
-        guard = std::make_unique<GuardedMessagePorts>(fakes, onFatalRecord);
+    void open(OnFatalRecord onFatalRecord, const std::string& modem = "") {
+        guard = std::make_unique<GuardedMessagePorts>(fakes, onFatalRecord,
+                                                      GuardedMessagePorts::PacketNumber(), modem);
         reopen();
     }
     void reopen() {
@@ -96,6 +97,13 @@ TEST_F(GuardedMessagePortsTest, WithSkipItIsALineOfTheSystemLog) {
     EXPECT_EQ(received, 1);
     EXPECT_EQ(log.lines(), (Lines{{3, "packet 1 (log code 0xFF0000): bad list"},
                                   {3, "packet 3 (log code 0xFF0000): bad list"}}));
+}
+
+TEST_F(GuardedMessagePortsTest, TheModemIsNamedIfItHasAName) {
+    open(OnFatalRecord::Skip, "car1");
+    fakes.deliver(kExtended);
+    queue.runReady();
+    EXPECT_EQ(log.lines(), (Lines{{3, "car1: packet 1 (log code 0xFF0000): bad list"}}));
 }
 
 TEST_F(GuardedMessagePortsTest, ATemplateThatCannotBeLoadedIsNoRecordsFault) {

@@ -34,6 +34,38 @@ TEST_F(SocketDirectoryTest, IsMadeForItsUserAlone) {
     EXPECT_EQ(refusal(), ""); // it exists the second time
 }
 
+TEST_F(SocketDirectoryTest, AServiceWithANameHasAFolderOfItsOwn) {
+    EXPECT_EQ(SocketDirectory::services(), std::vector<std::string>());
+    const auto directory = SocketDirectory::open("car1");
+    ASSERT_TRUE(directory);
+    EXPECT_EQ(directory->path(), _folder.file("pallax/services/car1"));
+    EXPECT_EQ(directory->service(), "car1");
+    EXPECT_EQ(SocketDirectory::open()->service(), "");
+    ASSERT_TRUE(SocketDirectory::open("a"));
+    _folder.write("pallax/services/file", "x");
+    EXPECT_EQ(SocketDirectory::services(), (std::vector<std::string>{"a", "car1"}));
+}
+
+TEST_F(SocketDirectoryTest, EveryFolderAboveThatOfAServiceIsPrivate) {
+    ASSERT_TRUE(SocketDirectory::open("car1"));
+    for (const char* folder : {"pallax/services/car1", "pallax/services", "pallax"}) {
+        ASSERT_EQ(::chmod(_folder.file(folder).c_str(), 0755), 0);
+        const auto refused = SocketDirectory::open("car1");
+        ASSERT_FALSE(refused) << folder;
+        EXPECT_EQ(refused.error().sentence,
+                  "The folder for message ports, " + _folder.file(folder) +
+                      ", can be entered by other users (its mode must be 0700).");
+    }
+}
+
+TEST_F(SocketDirectoryTest, ANameThatLeadsElsewhereIsRefused) {
+    const auto refused = SocketDirectory::open("..");
+    ASSERT_FALSE(refused);
+    EXPECT_EQ(refused.error().sentence, "The folder for message ports, " +
+                                            _folder.file("pallax/services/..") +
+                                            ", is not the folder of a service.");
+}
+
 TEST_F(SocketDirectoryTest, AFolderThatOthersMayEnterIsRefused) {
     for (const mode_t mode : {0750U, 0701U, 0770U, 0777U}) {
         (void)::mkdir(_folder.file("pallax").c_str(), 0700);

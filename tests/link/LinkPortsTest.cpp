@@ -157,5 +157,14 @@ TEST_F(LinkPortsTest, WhyTheServiceGivesNoLogChannelIsToldInWords) {
     EXPECT_EQ(_link.briefObstacle(), "no answer");
 }
 
+TEST_F(LinkPortsTest, AMissingServiceThatHasANameIsNamed) {
+    LinkPorts link{
+        {_crowd, telephony, kOwnName, [] { return std::string(); }, [] { return false; }, "car1"}};
+    telephony.reachable = false;
+    EXPECT_EQ(link.connect({}), nullptr);
+    EXPECT_EQ(link.obstacle(), "No telephony service named car1 is running");
+    EXPECT_EQ(link.briefObstacle(), "no service");
+}
+
 } // namespace
 } // namespace pallax

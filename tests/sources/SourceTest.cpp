@@ -35,6 +35,7 @@ TEST(Source, APathLeadsToAFileOrToAStream) {
 
 TEST(Source, HasANameForMessages) {
     EXPECT_EQ(sourceName(ServiceModem()), "live modem");
+    EXPECT_EQ(sourceName(ServiceModem{"car1"}), "car1");
     EXPECT_EQ(sourceName(FileRecording{"a/drive.pcap"}), "a/drive.pcap");
     EXPECT_EQ(sourceName(StreamedRecording{"-"}), "standard input");
     EXPECT_EQ(sourceName(StreamedRecording{"/dev/fd/63"}), "/dev/fd/63");
@@ -64,6 +65,7 @@ TEST(Source, NumberedPartsAreOneRecording) {
 
 TEST(Source, IsWrittenAsArguments) {
     EXPECT_EQ(argumentsOf(ServiceModem()), (Arguments{"service"}));
+    EXPECT_EQ(argumentsOf(ServiceModem{"car1"}), (Arguments{"service", "car1"}));
     EXPECT_EQ(argumentsOf(FileRecording{"a b"}), (Arguments{"file", "a b"}));
     EXPECT_EQ(argumentsOf(FileRecording{"a", {"b", "c"}}), (Arguments{"file", "a", "b", "c"}));
     EXPECT_EQ(argumentsOf(StreamedRecording{"-", "pipe"}), (Arguments{"stream", "-", "pipe"}));
@@ -111,8 +113,9 @@ TEST(Source, IsReadFromItsArguments) {
 
 TEST(Source, OtherArgumentsStandForNone) {
     for (const Arguments& arguments :
-         {Arguments{}, Arguments{"modem"}, Arguments{"service", "x"}, Arguments{"file"},
-          Arguments{"stream", "-"}, Arguments{"simulated"}, Arguments{"simulated", "lte", "1"},
+         {Arguments{}, Arguments{"modem"}, Arguments{"service", ".x"},
+          Arguments{"service", "x", "y"}, Arguments{"file"}, Arguments{"stream", "-"},
+          Arguments{"simulated"}, Arguments{"simulated", "lte", "1"},
           Arguments{"simulated", "nr", "1", "40"}, Arguments{"simulated", "lte", "-1", "40"},
           Arguments{"simulated", "lte", "1", "0"}, Arguments{"simulated", "lte", "1", "40", "0"},
           Arguments{"simulated", "lte", "1", "40", "6x"},

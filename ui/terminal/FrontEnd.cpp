@@ -223,7 +223,7 @@ void FrontEnd::handlePage(const KeyEvent& event) {
         return needsDisplay();
     }
     const char32_t character = event.key == Key::Character ? event.character : 0;
-    if (handleTime(event)) {
+    if (handleTime(event) || handleNumber(character)) {
         return;
     }
     if (character == U'q' && !navigation()->isAtRoot()) {

@@ -62,6 +62,8 @@ public:
         std::function<std::chrono::seconds()> ahead = [] { return std::chrono::seconds(0); };
         /// Goes back in time; null if there is only the present. Must outlive the front end.
         Travel* travel = nullptr;
+        /// Shows the modem with this number, from 1, if there is one.
+        std::function<void(std::size_t number)> chooseModem = [](std::size_t /*number*/) {};
 
         ShownValues::Source valueSource() const;
     };
@@ -98,6 +100,7 @@ public:
     void setStream(std::string state);
     /// The names of the alarms that are true.
     void setAlarms(std::vector<std::string> names);
+    bool hasAlarms() const { return !_alarms.empty(); }
     /// After a restart of the link: the values are from before `time` ("22:13:30"); if empty, they
     /// are current.
     void setOldValues(std::string time);
@@ -119,6 +122,8 @@ private:
     void handleMouse(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
     void handlePage(const KeyEvent& event);
+    /// The key of a number: shows that modem. False for any other key.
+    bool handleNumber(char32_t character);
     /// The keys for time; false for any other.
     bool handleTime(const KeyEvent& event);
     void openChanges();

@@ -40,6 +40,14 @@ void Grid::clear(int x, int y, int columns, int rows) {
     }
 }
 
+void Grid::paste(const Grid& other, int x, int y) {
+    for (int row = 0; row < other.rows() && y + row < _rows; ++row) {
+        for (int column = 0; column < other.columns() && x + column < _columns; ++column) {
+            _cells[index(x + column, y + row)] = other.at(column, row);
+        }
+    }
+}
+
 void Grid::fill(Span span, int y, std::string_view text, Style style) {
     for (int column = span.left; column < span.right; ++column) {
         put(column, y, text, style);

@@ -61,6 +61,9 @@ public:
     }
     /// Blanks a rectangle.
     void clear(int x, int y, int columns, int rows);
+    /// Copies all cells of another grid to a place in this one, as far as there is room. Their
+    /// right edge must not cut a wide character. The cursor stays where it is.
+    void paste(const Grid& other, int x, int y);
     /// Repeats a text of one column.
     void fill(Span span, int y, std::string_view text, Style style = {});
 

@@ -8,6 +8,7 @@ namespace {
 
 constexpr auto kPanes = static_cast<unsigned>(HelpPlace::Panes);
 constexpr auto kPages = static_cast<unsigned>(HelpPlace::Pages);
+constexpr auto kModems = static_cast<unsigned>(HelpPlace::Modems);
 constexpr auto kSave = static_cast<unsigned>(HelpPlace::Save);
 
 constexpr auto kKeyHelp = std::to_array<KeyHelp>({
@@ -39,6 +40,8 @@ constexpr auto kKeyHelp = std::to_array<KeyHelp>({
     {"s", "save a snapshot", kPanes},
     {"y", "copy the value", kPanes},
     {"R", "reconnect, drop old values", kPanes | kPages},
+    {"1-9", "one of several modems", kModems},
+    {"Ctrl-N", "the next of several modems", kModems},
     {"Tab", "next field on the save screen", kSave},
     {"Click, wheel", "open the row; scroll"},
     {"Ctrl-L", "redraw the screen"},

@@ -5,8 +5,8 @@
 
 namespace pallax::terminal {
 
-/// Where keys can be pressed. A value is one bit.
-enum class HelpPlace : unsigned { Panes = 1, Pages = 2, Save = 4 };
+/// Where keys can be pressed. A value is one bit. Modems: where there are several.
+enum class HelpPlace : unsigned { Panes = 1, Pages = 2, Save = 4, Modems = 8 };
 
 /// Keys and what they do, as the help page and the manual list them.
 struct KeyHelp {

@@ -79,8 +79,16 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
     case U'q':
         return navigation()->isAtRoot() ? _surroundings.quit() : navigation()->back();
     default:
-        return pane.handleListKey(character);
+        return handleNumber(character) ? void() : pane.handleListKey(character);
     }
+}
+
+bool FrontEnd::handleNumber(char32_t character) {
+    const bool isNumber = character >= U'1' && character <= U'9';
+    if (isNumber) {
+        _surroundings.chooseModem(static_cast<std::size_t>(character - U'0'));
+    }
+    return isNumber;
 }
 
 bool FrontEnd::moveCursor(TerminalTable& table, const KeyEvent& event) {

@@ -127,6 +127,8 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ s                 save a snapshot               │
 │ y                 copy the value                │
 │ R                 reconnect, drop old values    │
+│ 1-9               one of several modems         │
+│ Ctrl-N            the next of several modems    │
 │ Tab               next field on the save screen │
 │ Click, wheel      open the row; scroll          │
 │ Ctrl-L            redraw the screen             │
@@ -146,7 +148,7 @@ TEST(OverlaysTest, TheHelpPageIsShownFromALineOn) {
 | PgUp PgDn        |
 |  one page up or  |
 |  down            |
-+----------- v 96 -+
++---------- v 102 -+
 )");
 }
 

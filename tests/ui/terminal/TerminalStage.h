@@ -40,7 +40,8 @@ public:
                     {[this] { return earlier; },
                      [this](const std::string& query) { remembered.push_back(query); }},
                     [this] { return ahead; },
-                    travel},
+                    travel,
+                    [this](std::size_t number) { chooseModem(number); }},
                    marks),
           _window(frontEnd.toolkit().makeWindow({})) {
         auto root = std::make_shared<PallaxPaneController>(frontEnd.toolkit(), *this, nullptr, "/");
@@ -67,6 +68,7 @@ public:
     std::vector<std::uint64_t> went;
     std::chrono::seconds ahead{0};
     std::function<bool()> mayGoOn = [] { return true; };
+    std::function<void(std::size_t)> chooseModem = [](std::size_t) {};
     std::vector<std::string> earlier; ///< queries
     std::vector<std::string> remembered;
 
