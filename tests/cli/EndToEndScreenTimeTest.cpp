@@ -6,6 +6,12 @@
 namespace pallax {
 namespace {
 
+/// As a terminal reports the mouse: button and motion, column, row, and whether it is pressed.
+std::string mouse(int what, int column, int row, char kind) {
+    return "\x1b[<" + std::to_string(what) + ";" + std::to_string(column) + ";" +
+           std::to_string(row) + kind;
+}
+
 TEST_F(EndToEndScreen, TimeIsHeldSteppedAndLeftWhileTheScreenStays) {
     PallaxTerminal terminal(world, {lteDrive(), "--speed", "max"}, {});
     ASSERT_TRUE(terminal.shows("End of the recording"));
@@ -23,6 +29,29 @@ TEST_F(EndToEndScreen, TimeIsHeldSteppedAndLeftWhileTheScreenStays) {
     EXPECT_EQ(terminal.wait(), 0);
     EXPECT_TRUE(terminal.isRestored());
     expectNothingLeft();
+}
+
+TEST_F(EndToEndScreen, TheMouseDragsTheHeldInstantAlongTheBar) {
+    constexpr int kMoved = 0x20;
+    PallaxTerminal terminal(world, {lteDrive(), "--speed", "max"}, {});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    terminal.type("^");
+    ASSERT_TRUE(terminal.shows("22:13:20"));
+    std::string flood = mouse(0, 3, 24, 'M');
+    for (int column = 0; column < 200; ++column) {
+        flood += mouse(kMoved, 3 + column % 8, 24, 'M');
+    }
+    const std::size_t before = terminal.bytes().size();
+    terminal.type(flood + mouse(kMoved, 12, 24, 'M'));
+    EXPECT_TRUE(terminal.shows("22:14:17"));
+    EXPECT_LT(terminal.bytes().size() - before, 10'000U); // positions in between are not drawn
+    terminal.type(mouse(kMoved, 3, 10, 'M'));
+    EXPECT_TRUE(terminal.shows("22:13:20"));
+    terminal.type(mouse(0, 3, 10, 'm') + mouse(kMoved, 12, 24, 'M') + "$");
+    EXPECT_TRUE(terminal.showsNoMore("held"));
+    terminal.type("q");
+    EXPECT_EQ(terminal.wait(), 0);
+    EXPECT_TRUE(terminal.isRestored());
 }
 
 TEST_F(EndToEndScreen, WhatIsHeldOfARecordingThatHasGrownSaysSo) {

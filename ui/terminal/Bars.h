@@ -48,7 +48,7 @@ struct TimeBar {
     std::optional<double> marked = {};
     std::vector<double> events = {};
     bool isPlaying = false;
-    std::function<void(double)> go = [](double) {}; ///< by a click
+    std::function<void(double)> go = [](double) {}; ///< by a click or by dragging
 };
 
 /// What is shown around the content besides the pane's own items.

@@ -155,6 +155,13 @@ void FrontEnd::handle(const KeyEvent& event) {
     if (navigation == nullptr) {
         return;
     }
+    if (event.key == Key::Drag) {
+        return handleDrag(event);
+    }
+    _dragged.reset();
+    if (event.key == Key::Release) {
+        return;
+    }
     if (event.key == Key::Character && event.character == controlKey('l')) {
         _surroundings.repaint();
         return;
@@ -201,9 +208,18 @@ void FrontEnd::handleMouse(const KeyEvent& event) {
         }
         return;
     }
+    _dragged = _hits.sliderAt(event.x, event.y);
     // A copy, because the action may change the screen.
     if (const HitMap::Action action = _hits.at(event.x, event.y)) {
         action();
+        needsDisplay();
+    }
+}
+
+void FrontEnd::handleDrag(const KeyEvent& event) {
+    if (_dragged) {
+        _message.reset();
+        _dragged->moveTo(event.x);
         needsDisplay();
     }
 }

@@ -117,6 +117,8 @@ private:
     void needsDisplay();
     void drawScreen(Grid& grid, TerminalNavigation& navigation);
     void handleMouse(const KeyEvent& event);
+    /// Moves what the mouse button was pressed on.
+    void handleDrag(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
     void handlePage(const KeyEvent& event);
     /// The keys for time; false for any other.
@@ -158,6 +160,7 @@ private:
     Surroundings _surroundings;
     const Marks& _marks;
     HitMap _hits;
+    std::optional<Slider> _dragged; ///< while the mouse button is held on it
     TerminalToolkit _toolkit;
     ModalKeys _modalKeys;
     mutable TimeControl _time;

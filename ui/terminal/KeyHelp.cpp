@@ -40,7 +40,7 @@ constexpr auto kKeyHelp = std::to_array<KeyHelp>({
     {"y", "copy the value", kPanes},
     {"R", "reconnect, drop old values", kPanes | kPages},
     {"Tab", "next field on the save screen", kSave},
-    {"Click, wheel", "open the row; scroll"},
+    {"Click, wheel", "open; scroll; drag time bar"},
     {"Ctrl-L", "redraw the screen"},
     {"Ctrl-Z", "suspend; fg resumes"},
     {"?", "this help"},

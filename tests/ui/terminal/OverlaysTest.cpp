@@ -128,7 +128,7 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ y                 copy the value                │
 │ R                 reconnect, drop old values    │
 │ Tab               next field on the save screen │
-│ Click, wheel      open the row; scroll          │
+│ Click, wheel      open; scroll; drag time bar   │
 │ Ctrl-L            redraw the screen             │
 │ Ctrl-Z            suspend; fg resumes           │
 │ ?                 this help                     │
