@@ -69,5 +69,31 @@ TEST_F(EndToEndScreen, WhatIsHeldOfARecordingThatHasGrownSaysSo) {
     EXPECT_EQ(terminal.wait(), 0);
 }
 
+TEST_F(EndToEndScreen, WhatIsAppendedToARecordingJoinsItsTimeline) {
+    constexpr std::size_t kPcapHeader = 24;
+    const std::string path = world.path("grows.pcap");
+    const std::string drive = contentOf(lteDrive());
+    std::ofstream(path, std::ios::binary) << drive;
+    PallaxTerminal terminal(world, {path, "--speed", "max"}, {});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    terminal.type("^e");
+    ASSERT_TRUE(terminal.shows("22:15:19"));
+    const auto events = [&terminal] {
+        const std::string title = terminal.screen().text();
+        const std::size_t end = title.find(" events");
+        return std::stoi(title.substr(title.rfind(' ', end - 1) + 1));
+    };
+    (void)terminal.settled();
+    const int before = events();
+    std::ofstream(path, std::ios::binary | std::ios::app) << drive.substr(kPcapHeader);
+    EXPECT_TRUE(doubles::eventually([&] {
+        (void)terminal.settled();
+        return events() > before;
+    }));
+    EXPECT_EQ(terminal.screen().text().find("has grown"), std::string::npos);
+    terminal.type("qq");
+    EXPECT_EQ(terminal.wait(), 0);
+}
+
 } // namespace
 } // namespace pallax
