@@ -54,7 +54,7 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     bool isWhole = false;
     try {
         PrintBrowser browser(
-            std::move(directory), request.onFatalRecord, child, request.settings.afterReconnect,
+            std::move(directory), request.onFatalRecord, child, request.settings,
             output, sourceName(request.options.source),
             request.options.plain ? TreePrinter::Form::Sentences : TreePrinter::Form::Tree);
         isWhole = browser.run();

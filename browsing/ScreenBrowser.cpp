@@ -195,13 +195,18 @@ void ScreenBrowser::tick() {
     const StateMoment moment{now, _link.clock().packetNumber(), ++_ticks};
     for (const AlarmWatch::Change& change : _alarms.tick(moment)) {
         const auto held = std::chrono::round<std::chrono::seconds>(change.held).count();
-        _watch.add({EventKind::Alarm,
+        Event event{EventKind::Alarm,
                     now,
                     moment.packet,
                     change.isTrue ? "alarm: " + change.rule->name
                                   : formatText("alarm ended: %@ (held for %lld s)",
                                                {change.rule->name, held}),
-                    {}});
+                    {}};
+        _watch.add(event);
+        if (Timeline* const timeline = _timeline.timeline()) {
+            event.packet = _timeline.present();
+            timeline->add(std::move(event));
+        }
         if (change.isTrue && change.rule->ringsBell) {
             _terminal.ringBell();
         }
