@@ -13,6 +13,7 @@
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/JoinedRecording.h"
+#include "host/KnowledgeFiles.h"
 #include "host/LogSinks.h"
 #include "host/RecordingFile.h"
 #include "host/RecordingParts.h"
@@ -44,6 +45,7 @@ bool endChild(ChildService& child) {
 struct Request {
     const BrowseOptions& options;
     const Settings& settings;
+    QualityProfile profile;
     OnFatalRecord onFatalRecord;
     bool isOnScreen;
 };
@@ -53,10 +55,10 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     bool isWhole = false;
     try {
-        PrintBrowser browser(
-            std::move(directory), request.onFatalRecord, child, request.settings,
-            output, sourceName(request.options.source),
-            request.options.plain ? TreePrinter::Form::Sentences : TreePrinter::Form::Tree);
+        PrintBrowser browser(std::move(directory), request.onFatalRecord, child, request.settings,
+                             output, sourceName(request.options.source),
+                             request.options.plain ? TreePrinter::Form::Sentences
+                                                   : TreePrinter::Form::Tree);
         isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // the printed text and the generators' notices
@@ -85,7 +87,8 @@ bool browseOnScreen(const Request& request, SocketDirectory directory, ChildServ
     }
     const GuardedTerminal guard;
     ScreenBrowser browser(std::move(directory), request.onFatalRecord, child,
-                          request.options.source, request.settings, **terminal, notices);
+                          request.options.source, request.settings, request.profile, **terminal,
+                          notices);
     return browser.run();
 }
 
@@ -203,9 +206,15 @@ ExitStatus runBrowse(const BrowseOptions& wanted) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
-    const Request request{
-        options, *settings, options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,
-        !options.print && !options.plain && terminal::CursesTerminal::isPossible()};
+    auto profile = loadProfile(options.profile.value_or(settings->profile), profileFolder());
+    if (!profile) {
+        complain(profile.error().sentence);
+        return options.profile && profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+    }
+    const Request request{options, *settings, std::move(profile).value(),
+                          options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,
+                          !options.print && !options.plain &&
+                              terminal::CursesTerminal::isPossible()};
     SyslogSink syslog("pallax");
     if (!options.logLevel) {
         const ScopedLog log(syslog, settings->systemLogLevel);

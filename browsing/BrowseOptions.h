@@ -5,6 +5,7 @@
 #include "ui/terminal/CursesTerminal.h"
 
 #include <optional>
+#include <string>
 
 namespace pallax {
 
@@ -15,6 +16,7 @@ struct BrowseOptions {
     bool plain = false; ///< prints sentences instead of trees
     terminal::ColorUse color = terminal::ColorUse::Auto;
     bool mouse = true;
+    std::optional<std::string> profile; ///< that judges levels; nothing: that of the settings
     bool keepGoing = false;
     std::optional<int> logLevel; ///< system-log lines up to it go to standard error
 };

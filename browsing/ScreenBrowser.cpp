@@ -21,6 +21,7 @@ namespace {
 
 constexpr std::chrono::milliseconds kTurnInterval{150};
 constexpr std::chrono::milliseconds kSilentWork{100};
+constexpr std::chrono::milliseconds kFrame{50}; // in which all that is typed is drawn once
 
 /// The terminal's marks, with the curves of the settings unless they must be ASCII.
 terminal::Marks marksWith(terminal::Marks marks, CurveCharacters curves) {
@@ -36,7 +37,8 @@ terminal::Marks marksWith(terminal::Marks marks, CurveCharacters curves) {
 
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
                              ChildService* child, const Source& source, const Settings& settings,
-                             terminal::CursesTerminal& terminal, StandardOutput& notices)
+                             QualityProfile profile, terminal::CursesTerminal& terminal,
+                             StandardOutput& notices)
     : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, notices),
       _keys(_link.queue(), terminal.inputDescriptor()), _watch(_link.resources()),
       _timeline({.link = _link,
@@ -58,7 +60,7 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
                [this](const auto& text) {
                    _frontEnd.toolkit().showAlert({"Alarms that are left out", text, "Close"});
                }}),
-      _marks(marksWith(terminal.marks(), settings.curves)),
+      _profile(std::move(profile)), _marks(marksWith(terminal.marks(), settings.curves)),
       _frontEnd(frontEndSurroundings(), _marks), _preferences(FilePreferences::userFolder()),
       _session(sessionSurroundings(source, settings)) {
     _frontEnd.showListsAsTables(settings.lists == Lists::Table);
@@ -99,7 +101,8 @@ terminal::FrontEnd::Surroundings ScreenBrowser::frontEndSurroundings() {
             .mayGoOn = [this] { return mayGoOn("Working. Esc stops."); },
             .queries = querySeams(),
             .ahead = [this] { return _link.clock().zone(_link.clock().now()).offset; },
-            .travel = &_travel};
+            .travel = &_travel,
+            .profile = [this]() -> const QualityProfile& { return _profile; }};
 }
 
 Travel::Surroundings ScreenBrowser::travelSurroundings() {
@@ -265,10 +268,9 @@ const NetworkNames& ScreenBrowser::names() {
 }
 
 Overview ScreenBrowser::overview() {
-    const QualityProfile profile = *builtInProfile(kDefaultProfile);
     const Time now = _link.clock().now();
-    Overview overview = _travel.isAway() ? overviewAt(_travel.moment(), names(), profile)
-                                         : _watch.overview(now, names(), profile);
+    Overview overview = _travel.isAway() ? overviewAt(_travel.moment(), names(), _profile)
+                                         : _watch.overview(now, names(), _profile);
     overview.ahead = _link.clock().zone(now).offset;
     return overview;
 }
@@ -314,12 +316,24 @@ void ScreenBrowser::readKey() {
         _workBegan.reset();
         _frontEnd.handle(*key);
         tellTrouble();
+        noteTyping(*key);
         _link.queue().async([this] { readKey(); });
     } else if (_terminal.isHungUp()) {
         _session.quit();
     } else {
         waitForKey();
     }
+}
+
+/// Of characters that come at once, such as a pasted text, not each is drawn.
+void ScreenBrowser::noteTyping(const terminal::KeyEvent& key) {
+    if (_typedAhead.empty()) {
+        if (const auto next = _terminal.read()) {
+            _typedAhead.push_back(*next);
+        }
+    }
+    _isTypingOn = key.key == terminal::Key::Character && !_typedAhead.empty() &&
+                  _typedAhead.front().key == terminal::Key::Character;
 }
 
 void ScreenBrowser::needsDisplay() {
@@ -330,6 +344,11 @@ void ScreenBrowser::needsDisplay() {
 }
 
 void ScreenBrowser::display() {
+    const auto now = std::chrono::steady_clock::now();
+    if (_isTypingOn && now - _shown < kFrame) {
+        return _link.queue().async([this] { display(); });
+    }
+    _shown = now;
     _terminal.show(_frontEnd.draw());
     _isDisplayPosted = false; // drawing itself asks for no other drawing
     keepTurning();

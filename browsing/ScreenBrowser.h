@@ -5,6 +5,7 @@
 #include "host/FilePreferences.h"
 #include "host/HostFileSystem.h"
 #include "knowledge/Networks.h"
+#include "knowledge/Quality.h"
 #include "link/BrowseLink.h"
 #include "overview/StatusWatch.h"
 #include "travel/Travel.h"
@@ -28,7 +29,7 @@ public:
     /// Terminal and notices must outlive the browser: errors and notices are printed once the
     /// terminal is restored.
     ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                  const Source& source, const Settings& settings,
+                  const Source& source, const Settings& settings, QualityProfile profile,
                   terminal::CursesTerminal& terminal, StandardOutput& notices);
     ScreenBrowser(const ScreenBrowser&) = delete;
     ScreenBrowser& operator=(const ScreenBrowser&) = delete;
@@ -44,6 +45,7 @@ private:
     terminal::FrontEnd::Surroundings frontEndSurroundings();
     void waitForKey();
     void readKey();
+    void noteTyping(const terminal::KeyEvent& key);
     void begin(const std::string& technology);
     void tick();
     void tellTrouble();
@@ -66,10 +68,13 @@ private:
     Travel _travel;
     std::optional<std::chrono::steady_clock::time_point> _workBegan; ///< since the latest key
     std::chrono::steady_clock::time_point _lookedForKey;
-    std::deque<terminal::KeyEvent> _typedAhead; ///< keys that came during work
-    std::optional<std::string> _toldTrouble;    ///< of the timeline, since time is held
+    std::deque<terminal::KeyEvent> _typedAhead;   ///< keys that came during work
+    bool _isTypingOn = false;                     ///< another character waits after the latest
+    std::chrono::steady_clock::time_point _shown; ///< when the screen was drawn
+    std::optional<std::string> _toldTrouble;      ///< of the timeline, since time is held
     AlarmWatch _alarms;
     std::uint64_t _ticks = 0;
+    const QualityProfile _profile;
     std::optional<NetworkNames> _names; ///< read when a page asks for the first time
     const terminal::Marks _marks;
     terminal::FrontEnd _frontEnd;

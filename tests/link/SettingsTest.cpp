@@ -18,6 +18,11 @@ std::string sentenceFor(std::string_view text) {
     return settings ? "no error" : settings.error().sentence;
 }
 
+TEST(Settings, AProfileIsItsName) {
+    EXPECT_EQ(parseSettings("", "pallax.conf")->profile, "android");
+    EXPECT_EQ(parseSettings("profile = survey", "pallax.conf")->profile, "survey");
+}
+
 TEST(Settings, AreReadLineByLine) {
     const auto settings = parseSettings("# a comment\n"
                                         "\n"

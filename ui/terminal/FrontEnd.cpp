@@ -79,6 +79,7 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .alarms = _alarms,
                             .zone = _surroundings.zone(),
                             .press = [this](const KeyEvent& event) { handle(event); },
+                            .standing = [this](const auto& path) { return standingOfRow(path); },
                             .curve = [this](const std::string& path,
                                             int columns) { return curveOfRow(path, columns); }};
     if (_pages.isOpen()) {
@@ -233,7 +234,7 @@ void FrontEnd::handleAlert(const KeyEvent& event) {
     }
 }
 
-/// The keys for help, a fresh start and quitting work as in a pane.
+/// The keys for help and a fresh start work as in a pane.
 void FrontEnd::handlePage(const KeyEvent& event) {
     if (_pages.handle(event) != PageAnswer::NotMine) {
         return needsDisplay();
@@ -242,10 +243,10 @@ void FrontEnd::handlePage(const KeyEvent& event) {
     if (handleTime(event)) {
         return;
     }
-    if (character == U'q' && !navigation()->isAtRoot()) {
+    if (character == U'q') {
         _pages.closeTop();
         needsDisplay();
-    } else if (character == U'q' || character == U'?' || character == U'R' || character == U'V') {
+    } else if (character == U'?' || character == U'R' || character == U'V') {
         handlePaneCharacter(character);
     }
 }

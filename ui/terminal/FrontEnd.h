@@ -62,6 +62,8 @@ public:
         std::function<std::chrono::seconds()> ahead = [] { return std::chrono::seconds(0); };
         /// Goes back in time; null if there is only the present. Must outlive the front end.
         Travel* travel = nullptr;
+        /// Judges levels.
+        std::function<const QualityProfile&()> profile = ShownValues::Source().profile;
 
         ShownValues::Source valueSource() const;
     };
@@ -144,6 +146,7 @@ private:
     bool findAgain(const KeyEvent& event);
     void findRowAgain(bool isForward);
     void findInstantAgain(bool isForward);
+    std::string_view standingOfRow(const std::string& path);
     std::string curveOfRow(const std::string& path, int columns);
     Overview overviewWithCurves();
     void goBack(TerminalTable& table);
