@@ -164,7 +164,7 @@ TEST_F(EndToEndTerminal, QualityHasTheColoursThatTheTerminalHas) {
                                   terminal.screen().colorOf("good") + " " +
                                   terminal.screen().colorOf("-12.62 dB");
         EXPECT_EQ(terminal.screen().unknown(), "") << type;
-        terminal.type("q");
+        terminal.type("qq");
         EXPECT_EQ(terminal.wait(), 0);
         return found;
     };
