@@ -206,7 +206,8 @@ ExitStatus runBrowse(const BrowseOptions& wanted) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
-    auto profile = loadProfile(options.profile.value_or(settings->profile), profileFolder());
+    const std::string usual = settings->profile.value_or(std::string(kDefaultProfile));
+    auto profile = loadProfile(options.profile.value_or(usual), profileFolder());
     if (!profile) {
         complain(profile.error().sentence);
         return options.profile && profile.error().isUnknown ? kExitWrongUsage : kExitFailure;

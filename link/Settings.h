@@ -3,7 +3,6 @@
 #include "console/ScopedLog.h"
 #include "decoding/FatalRecord.h"
 #include "host/BoundedJournal.h"
-#include "knowledge/Quality.h"
 #include "link/AlarmRule.h"
 #include "text/Result.h"
 
@@ -34,7 +33,7 @@ struct Settings {
     FirstScreen firstScreen = FirstScreen::Panes;         ///< first-screen = panes | overview
     Lists lists = Lists::Rows;                            ///< lists = rows | table
     CurveCharacters curves = CurveCharacters::Braille;    ///< curves = braille | blocks | ascii
-    std::string profile{kDefaultProfile};                 ///< profile = NAME
+    std::optional<std::string> profile;                   ///< profile = NAME
     std::optional<std::string> snapshotDirectory;         ///< snapshot-directory = PATH
     std::optional<std::string> saveButtonMarker;          ///< save-button-marker = PATH
     int systemLogLevel = kSyslogLevel;                    ///< system-log-level = 0 ... 7

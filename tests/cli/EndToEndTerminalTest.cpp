@@ -55,7 +55,10 @@ TEST_F(EndToEndTerminal, ItIsSuspendedAndComesBack) {
     EXPECT_TRUE(terminal.showsNoMore("Stopped"));
     EXPECT_TRUE(terminal.shows("Process CO"));
     EXPECT_TRUE(terminal.screen().isOnOtherScreen());
-    EXPECT_TRUE(reportsMouse(terminal.bytes()));
+    EXPECT_TRUE(doubles::eventually([&terminal] {
+        (void)terminal.settled();
+        return reportsMouse(terminal.bytes());
+    }));
     terminal.type("q");
     EXPECT_TRUE(terminal.shows("$"));
     terminal.type("exit\r");

@@ -19,8 +19,9 @@ std::string sentenceFor(std::string_view text) {
 }
 
 TEST(Settings, AProfileIsItsName) {
-    EXPECT_EQ(parseSettings("", "pallax.conf")->profile, "android");
+    EXPECT_EQ(parseSettings("", "pallax.conf")->profile, std::nullopt);
     EXPECT_EQ(parseSettings("profile = survey", "pallax.conf")->profile, "survey");
+    EXPECT_EQ(sentenceFor("profile ="), "pallax.conf, line 1: profile needs a name.");
 }
 
 TEST(Settings, AreReadLineByLine) {
