@@ -13,6 +13,7 @@
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/JoinedRecording.h"
+#include "host/KnowledgeFiles.h"
 #include "host/LogSinks.h"
 #include "host/RecordingFile.h"
 #include "host/RecordingParts.h"
@@ -44,6 +45,7 @@ bool endChild(ChildService& child) {
 struct Request {
     const BrowseOptions& options;
     const Settings& settings;
+    QualityProfile profile;
     OnFatalRecord onFatalRecord;
     bool isOnScreen;
 };
@@ -53,10 +55,10 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
     Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
     bool isWhole = false;
     try {
-        PrintBrowser browser(
-            std::move(directory), request.onFatalRecord, child, request.settings.afterReconnect,
-            output, sourceName(request.options.source),
-            request.options.plain ? TreePrinter::Form::Sentences : TreePrinter::Form::Tree);
+        PrintBrowser browser(std::move(directory), request.onFatalRecord, child, request.settings,
+                             output, sourceName(request.options.source),
+                             request.options.plain ? TreePrinter::Form::Sentences
+                                                   : TreePrinter::Form::Tree);
         isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // the printed text and the generators' notices
@@ -93,8 +95,9 @@ bool browseOnScreen(const Request& request, SocketDirectory directory, ChildServ
         throw std::runtime_error(terminal.error().sentence);
     }
     const GuardedTerminal guard;
-    ScreenBrowser browser({request.settings, request.onFatalRecord, **terminal, notices},
-                          std::move(shown));
+    ScreenBrowser browser(
+        {request.settings, request.profile, request.onFatalRecord, **terminal, notices},
+        std::move(shown));
     return browser.run();
 }
 
@@ -213,9 +216,16 @@ ExitStatus runBrowse(const BrowseOptions& wanted) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
-    const Request request{
-        options, *settings, options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,
-        !options.print && !options.plain && terminal::CursesTerminal::isPossible()};
+    const std::string usual = settings->profile.value_or(std::string(kDefaultProfile));
+    auto profile = loadProfile(options.profile.value_or(usual), profileFolder());
+    if (!profile) {
+        complain(profile.error().sentence);
+        return options.profile && profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+    }
+    const Request request{options, *settings, std::move(profile).value(),
+                          options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,
+                          !options.print && !options.plain &&
+                              terminal::CursesTerminal::isPossible()};
     if (!request.isOnScreen && !options.further.empty()) {
         complain("Several modems are shown only on the screen of a terminal: give one --connect.");
         return kExitWrongUsage;

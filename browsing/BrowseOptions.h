@@ -6,6 +6,7 @@
 
 #include <cstddef>
 #include <optional>
+#include <string>
 #include <vector>
 
 namespace pallax {
@@ -20,6 +21,7 @@ struct BrowseOptions {
     bool plain = false; ///< prints sentences instead of trees
     terminal::ColorUse color = terminal::ColorUse::Auto;
     bool mouse = true;
+    std::optional<std::string> profile; ///< that judges levels; nothing: that of the settings
     bool keepGoing = false;
     std::optional<int> logLevel; ///< system-log lines up to it go to standard error
 };

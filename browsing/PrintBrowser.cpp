@@ -2,10 +2,12 @@
 
 #include "app/HomeScreenPreference.h"
 #include "console/Output.h"
+#include "decoding/InstalledKnowledge.h"
 #include "decoding/StampSentence.h"
 #include "host/Complaint.h"
 #include "host/FilePreferences.h"
 #include "link/WaitNotice.h"
+#include "overview/StatusWatch.h"
 #include "text/Format.h"
 
 #include <chrono>
@@ -20,10 +22,12 @@ void PrintBrowser::Notices::printLine(std::string_view line) {
 }
 
 PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
-                           ChildService* child, AfterReconnect afterReconnect, Output& output,
+                           ChildService* child, const Settings& settings, Output& output,
                            std::string source, TreePrinter::Form form)
-    : _source(std::move(source)), _afterReconnect(afterReconnect), _notices(output),
+    : _source(std::move(source)), _afterReconnect(settings.afterReconnect), _notices(output),
       _link(_queue, std::move(directory), onFatalRecord, child, _notices),
+      _alarms({settings.alarms, installedKnowledge(),
+               [](const std::string& text) { complain("Alarms that are left out: " + text); }}),
       _printer(
           output, _link.clock(), [this] { return _model->topLevelNodes(); }, form),
       _model(makeModel()) {}
@@ -66,7 +70,17 @@ void PrintBrowser::updateViewControllerFromModel() {
     _printer.updateViewControllerFromModel();
 }
 
-void PrintBrowser::generatorChosen(const std::string& /*technology*/, bool keepsDisplay) {
+/// Nothing is asked while the tree is printed, but a rule that cannot be asked is a mistake that
+/// its writer should see here too.
+void PrintBrowser::checkAlarms(const std::string& technology) {
+    StatusWatch watch(_link.resources());
+    watch.begin(technology);
+    _alarms.begin(watch.values());
+    _alarms.begin(nullptr);
+}
+
+void PrintBrowser::generatorChosen(const std::string& technology, bool keepsDisplay) {
+    checkAlarms(technology);
     _displayAge.generatorChosen(keepsDisplay, _link.clock().now());
     if (!keepsDisplay) {
         return;

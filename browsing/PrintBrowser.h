@@ -6,6 +6,7 @@
 #include "monitor/DisplayAge.h"
 #include "monitor/PallaxModel.h"
 #include "platform/StandardOutput.h"
+#include "watching/AlarmWatch.h"
 
 #include <memory>
 #include <string>
@@ -17,9 +18,9 @@ class Output;
 /// Browses without a terminal: a model and its printer.
 class PrintBrowser final : private ModelObserver {
 public:
-    /// `source` names the source in messages.
+    /// `source` names the source in messages. The settings must outlive the browser.
     PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
-                 AfterReconnect afterReconnect, Output& output, std::string source,
+                 const Settings& settings, Output& output, std::string source,
                  TreePrinter::Form form);
     /// Switches the home-screen preference off, as the application does, however browsing ended.
     ~PrintBrowser() override;
@@ -44,6 +45,7 @@ private:
     void updateViewControllerFromModel() override;
     void generatorChosen(const std::string& technology, bool keepsDisplay) override;
     std::unique_ptr<PallaxModel> makeModel();
+    void checkAlarms(const std::string& technology);
     void start();
     void look();
 
@@ -54,6 +56,7 @@ private:
     Notices _notices;
     AsioMainQueue _queue;
     BrowseLink _link;
+    AlarmWatch _alarms; ///< of which only the mistakes are told
     TreePrinter _printer;
     std::unique_ptr<PallaxModel> _model;
 };

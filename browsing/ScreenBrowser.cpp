@@ -12,6 +12,7 @@ namespace {
 
 constexpr std::chrono::milliseconds kTurnInterval{150};
 constexpr std::chrono::milliseconds kSilentWork{100};
+constexpr std::chrono::milliseconds kFrame{50}; // in which all that is typed is drawn once
 
 /// The terminal's marks, with the curves of the settings unless they must be ASCII.
 terminal::Marks marksWith(terminal::Marks marks, CurveCharacters curves) {
@@ -35,6 +36,7 @@ ScreenSession::Screen ScreenBrowser::screen(const Setup& setup) {
             .marks = _marks,
             .notices = setup.notices,
             .settings = setup.settings,
+            .profile = setup.profile,
             .onFatalRecord = setup.onFatalRecord,
             .needsDisplay = [this] { needsDisplay(); },
             .repaint =
@@ -125,12 +127,24 @@ void ScreenBrowser::readKey() {
         for (const auto& session : _sessions) {
             session->tellTrouble();
         }
+        noteTyping(*key);
         _queue.async([this] { readKey(); });
     } else if (_terminal.isHungUp()) {
         _queue.stop();
     } else {
         waitForKey();
     }
+}
+
+/// Of characters that come at once, such as a pasted text, not each is drawn.
+void ScreenBrowser::noteTyping(const terminal::KeyEvent& key) {
+    if (_typedAhead.empty()) {
+        if (const auto next = _terminal.read()) {
+            _typedAhead.push_back(*next);
+        }
+    }
+    _isTypingOn = key.key == terminal::Key::Character && !_typedAhead.empty() &&
+                  _typedAhead.front().key == terminal::Key::Character;
 }
 
 void ScreenBrowser::needsDisplay() {
@@ -141,6 +155,11 @@ void ScreenBrowser::needsDisplay() {
 }
 
 void ScreenBrowser::display() {
+    const auto now = std::chrono::steady_clock::now();
+    if (_isTypingOn && now - _shown < kFrame) {
+        return _queue.async([this] { display(); });
+    }
+    _shown = now;
     _terminal.show(_split.draw());
     _isDisplayPosted = false; // drawing itself asks for no other drawing
     keepTurning();

@@ -18,6 +18,7 @@ class ScreenBrowser {
 public:
     struct Setup {
         const Settings& settings;
+        const QualityProfile& profile; ///< judges levels
         OnFatalRecord onFatalRecord;
         terminal::CursesTerminal& terminal;
         StandardOutput& notices;
@@ -41,6 +42,7 @@ private:
     bool mayGoOn(const std::function<void()>& tell);
     void waitForKey();
     void readKey();
+    void noteTyping(const terminal::KeyEvent& key);
     void needsDisplay();
     void display();
     void keepTurning();
@@ -56,8 +58,10 @@ private:
     terminal::SplitScreen _split;
     std::optional<std::chrono::steady_clock::time_point> _workBegan; ///< since the latest key
     std::chrono::steady_clock::time_point _lookedForKey;
-    std::deque<terminal::KeyEvent> _typedAhead; ///< keys that came during work
-    std::unique_ptr<RepeatingTimer> _turning;   // while something on the screen turns
+    std::deque<terminal::KeyEvent> _typedAhead;   ///< keys that came during work
+    bool _isTypingOn = false;                     ///< another character waits after the latest
+    std::chrono::steady_clock::time_point _shown; ///< when the screen was drawn
+    std::unique_ptr<RepeatingTimer> _turning;     // while something on the screen turns
 };
 
 } // namespace pallax

@@ -90,7 +90,8 @@ terminal::FrontEnd::Surroundings ScreenSession::frontEndSurroundings() {
             .queries = querySeams(),
             .ahead = [this] { return _link.clock().zone(_link.clock().now()).offset; },
             .travel = &_travel,
-            .chooseModem = _screen.chooseModem};
+            .chooseModem = _screen.chooseModem,
+            .profile = [this]() -> const QualityProfile& { return _screen.profile; }};
 }
 
 Travel::Surroundings ScreenSession::travelSurroundings() {
@@ -162,13 +163,18 @@ void ScreenSession::tick() {
     const StateMoment moment{now, _link.clock().packetNumber(), ++_ticks};
     for (const AlarmWatch::Change& change : _alarms.tick(moment)) {
         const auto held = std::chrono::round<std::chrono::seconds>(change.held).count();
-        _watch.add({EventKind::Alarm,
+        Event event{EventKind::Alarm,
                     now,
                     moment.packet,
                     change.isTrue ? "alarm: " + change.rule->name
                                   : formatText("alarm ended: %@ (held for %lld s)",
                                                {change.rule->name, held}),
-                    {}});
+                    {}};
+        _watch.add(event);
+        if (Timeline* const timeline = _timeline.timeline()) {
+            event.packet = _timeline.present();
+            timeline->add(std::move(event));
+        }
         if (change.isTrue && change.rule->ringsBell) {
             _screen.ringBell();
         }
@@ -226,10 +232,9 @@ const NetworkNames& ScreenSession::names() {
 }
 
 Overview ScreenSession::overview() {
-    const QualityProfile profile = *builtInProfile(kDefaultProfile);
     const Time now = _link.clock().now();
-    Overview overview = _travel.isAway() ? overviewAt(_travel.moment(), names(), profile)
-                                         : _watch.overview(now, names(), profile);
+    Overview overview = _travel.isAway() ? overviewAt(_travel.moment(), names(), _screen.profile)
+                                         : _watch.overview(now, names(), _screen.profile);
     overview.ahead = _link.clock().zone(now).offset;
     return overview;
 }

@@ -6,6 +6,7 @@
 #include "host/FilePreferences.h"
 #include "host/HostFileSystem.h"
 #include "knowledge/Networks.h"
+#include "knowledge/Quality.h"
 #include "link/BrowseLink.h"
 #include "link/StreamState.h"
 #include "overview/StatusWatch.h"
@@ -33,6 +34,7 @@ public:
         const terminal::Marks& marks;
         StandardOutput& notices;
         const Settings& settings;
+        const QualityProfile& profile; ///< judges levels
         OnFatalRecord onFatalRecord;
         std::function<void()> needsDisplay; ///< requests a drawing soon
         std::function<void()> repaint;

@@ -6,10 +6,13 @@
 #include "platform/RecordedTechnology.h"
 
 #include <algorithm>
+#include <chrono>
 
 namespace pallax {
 
 namespace {
+
+constexpr std::chrono::seconds kLookForGrowth{2};
 
 /// The recording as its own journal; null if it is more than one file, cannot be read twice, or
 /// does not say what it holds.
@@ -46,6 +49,8 @@ void ViewedTimeline::begin(std::string_view technology) {
             std::make_unique<Timeline>(*_recording, DecodingSource{*_technology, _link.resources(),
                                                                    _link.bundle(), technologies()});
         _slices.start(*_whole);
+        _growth =
+            _link.queue().scheduleRepeating(kLookForGrowth, [this] { _slices.start(*_whole); });
     }
 }
 
@@ -61,7 +66,8 @@ Timeline* ViewedTimeline::timeline() {
 
 std::optional<std::string> ViewedTimeline::trouble() {
     Timeline* known = timeline();
-    return known == nullptr ? std::nullopt : known->journal().trouble();
+    const bool isGrown = _whole != nullptr && _recording->hasReadGrowth();
+    return known == nullptr || isGrown ? std::nullopt : known->journal().trouble();
 }
 
 std::uint64_t ViewedTimeline::present() {

@@ -53,6 +53,7 @@ private:
     std::unique_ptr<RecordingJournal> _recording; ///< null if packets are kept as they come
     std::unique_ptr<Timeline> _whole;             ///< of the recording
     IndexingSlices _slices;
+    std::unique_ptr<RepeatingTimer> _growth; ///< looks for packets that were added to the recording
     LiveTimeline _live;
 };
 

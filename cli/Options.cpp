@@ -233,6 +233,9 @@ void addView(CLI::App& app, BrowseOptions& options) {
     app.add_flag_callback(
         "--no-mouse", [&options] { options.mouse = false; },
         "Leave the mouse to the terminal, to select text");
+    app.add_option("--profile", options.profile,
+                   "The profile that judges levels (default: android, or that of pallax.conf)")
+        ->type_name("android|field|operator|NAME");
     app.add_flag("--keep-going", options.keepGoing,
                  "Drop a record that cannot be read instead of exiting with status 70");
     addLogLevel(app, options.logLevel);

@@ -83,6 +83,9 @@ void addRow(FieldInfo& info, Numbers& numbers, const FieldDescription& field,
     }
     if (field.condition && field.condition->otherwise.find('%') == std::string_view::npos) {
         addLabel(info.labels, field.condition->otherwise);
+        if (field.condition->otherwise != conversion.beyond) {
+            addLabel(info.otherwise, field.condition->otherwise);
+        }
     }
     if (std::find(info.codes.begin(), info.codes.end(), place.code) == info.codes.end()) {
         info.codes.push_back(place.code);

@@ -37,6 +37,7 @@ struct FieldInfo {
     std::optional<double> most;
     std::string meaning;
     std::vector<std::string> labels;
+    std::vector<std::string> otherwise; ///< those of `labels` that say that it has no value
     std::vector<LogCode> codes;
     bool isInList = false;
     bool identifies = false; ///< part of the identity of its list's entries

@@ -16,7 +16,10 @@ constexpr auto kLte = std::to_array<StatusField>({
     {Kind::Identity, "TAC", "lte.serving_cell_info.tracking_area_code"},
     {Kind::Channel, "EARFCN", "lte.serving_cell_info.download_frequency"},
     {Kind::Channel, "EARFCN", "lte.serving_cell_measurements.e_arfcn"},
+    {Kind::Uplink, "uplink", "lte.serving_cell_info.upload_frequency"},
     {Kind::Band, "band", "lte.serving_cell_info.freq_band_indicator"},
+    {Kind::Detail, "bandwidth", "lte.serving_cell_info.download_bandwidth"},
+    {Kind::Detail, "antenna ports", "lte.serving_cell_info.num_tx_antennas"},
     {Kind::Level, "RSRP", "lte.serving_cell_measurements.measured_rsrp"},
     {Kind::Level, "RSRP",
      "lte.connected_mode_lte_intra_frequency_measurement.serving_filtered_rsrp"},
@@ -52,6 +55,7 @@ constexpr auto kUmts = std::to_array<StatusField>({
     {Kind::Identity, "PSC", "gsm.umts_rr_info.scrambling_code"},
     {Kind::Channel, "UARFCN", "gsm.umts_rr_info.uarfcn"},
     {Kind::Channel, "UARFCN", "gsm.umts_rr_info.downlink_frequency"},
+    {Kind::Uplink, "uplink", "gsm.umts_rr_info.uplink_frequency"},
 });
 constexpr auto kActiveSet = std::to_array<StatusField>({
     {Kind::Identity, "PSC", "gsm.active_set.scrambling_code"},
@@ -73,6 +77,7 @@ constexpr auto kUtran = std::to_array<StatusField>({
     {Kind::Identity, "PSC", "utran.serving_cell_info.cell_scrambling_code"},
     {Kind::Identity, "LAC", "utran.serving_cell_info.local_area_code"},
     {Kind::Channel, "UARFCN", "utran.serving_cell_info.downlink_uarfcn"},
+    {Kind::Uplink, "uplink", "utran.serving_cell_info.uplink_uarfcn"},
     {Kind::Band, "band", "utran.serving_cell_info.freq_band_indicator"},
 });
 constexpr auto kUtranSet = std::to_array<StatusField>({

@@ -13,7 +13,9 @@ struct StatusField {
         Site,     ///< the cell's identity in its network, which knowledge can take apart
         Identity, ///< another part of the identity
         Channel,
-        Band, ///< the band's number, where the modem tells it
+        Uplink, ///< the channel of the uplink
+        Band,   ///< the band's number, where the modem tells it
+        Detail, ///< something else about the carrier
         Level,
     };
     Role role;

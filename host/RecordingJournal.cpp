@@ -126,6 +126,7 @@ private:
         _journal._error = error ? std::optional(error->sentence) : std::nullopt;
         _continueAt = _next;
         _sizeAtEnd = sizeOfFile(_journal._path);
+        _journal._sizeAtEnd = _sizeAtEnd;
         _recording.reset();
     }
     bool hasGrown() const {
@@ -176,6 +177,11 @@ std::optional<std::string> RecordingJournal::trouble() const {
         return formatText("%@ was changed while it was read.", {_path});
     }
     return _error;
+}
+
+bool RecordingJournal::hasReadGrowth() const {
+    return _watch.isSameFile() && !_hasChanged && !_error && _sizeAtEnd > _watch.size() &&
+           _sizeAtEnd == sizeOfFile(_path);
 }
 
 double RecordingJournal::share() const {

@@ -27,6 +27,8 @@ public:
     std::unique_ptr<PacketReader> reader(std::uint64_t from) override;
     /// That the file was replaced, changed, or became shorter or longer, or how it ends.
     std::optional<std::string> trouble() const override;
+    /// Whether the file has grown and the packets that were added have been read to the file's end.
+    bool hasReadGrowth() const;
     /// The part of the file up to the last place that was noted, 0 to 1.
     double share() const;
 
@@ -48,7 +50,8 @@ private:
     FileWatch _watch;
     const RecordedTechnology* _technology = nullptr;
     std::vector<Place> _places;
-    std::uint64_t _read = 0; // the end of the packet at the last place
+    std::uint64_t _read = 0;      // the end of the packet at the last place
+    std::uint64_t _sizeAtEnd = 0; // of the file, when a reader last reached its end
     bool _canSeek = true;
     bool _hasChanged = false;
     std::optional<std::string> _error;

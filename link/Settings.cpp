@@ -136,6 +136,13 @@ std::optional<std::string> take(Settings& settings, std::string_view key, std::s
     if (key == "curves") {
         return takeCurves(settings, value);
     }
+    if (key == "profile") {
+        if (value.empty()) {
+            return "profile needs a name";
+        }
+        settings.profile = value;
+        return std::nullopt;
+    }
     if (key != "snapshot-directory" && key != "save-button-marker") {
         return formatText("there is no setting \"%@\"", {key});
     }

@@ -49,6 +49,19 @@ std::string bandNumber(const std::string& text) {
                : text;
 }
 
+/// The frequency of an uplink's channel, or its number if that has no meaning.
+std::string uplinkText(RadioSystem system, const FieldValue& value) {
+    if (const auto number = wholeNumber(value.number)) {
+        for (const Carrier& carrier : carriersOf(system, *number)) {
+            const bool isBoth = carrier.downlink == carrier.uplink; // in a band of TDD
+            if (carrier.uplink && (carrier.isOfUplink || isBoth)) {
+                return megahertzText(carrier.uplink->hertz) + " MHz";
+            }
+        }
+    }
+    return "channel " + value.text();
+}
+
 /// One gathering.
 class Gathering {
 public:
@@ -143,8 +156,16 @@ void Gathering::addCell(const StatusCellFields& rule) {
                 cell.channel = identityOf(field, *value);
             }
             break;
+        case Role::Uplink:
+            cell.details.push_back(std::string(field.name) + " " + uplinkText(rule.system, *value));
+            break;
         case Role::Band:
             band = value;
+            break;
+        case Role::Detail:
+            if (tells(*value)) {
+                cell.details.push_back(std::string(field.name) + " " + value->text());
+            }
             break;
         case Role::Level:
             addLevel(cell, levelOf(field.name, field.field, *value));

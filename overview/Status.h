@@ -43,6 +43,7 @@ struct StatusCell {
     std::string band; ///< empty if the channel has no meaning
     std::optional<double> megahertz;
     std::vector<StatusValue> levels;
+    std::vector<std::string> details = {}; ///< "uplink 1775.0 MHz", "bandwidth 20 MHz"
 };
 
 struct StatusNeighbour {

@@ -98,6 +98,10 @@ std::vector<std::string> originOf(const FieldInfo& field, const LeafValue* value
 
 } // namespace
 
+Standing standingOf(const FieldInfo& field, const FieldValue& value) {
+    return standingOf(field, value.text(), value.number, value.raw);
+}
+
 std::string shortNumber(double number) {
     constexpr std::size_t kMost = 32;
     std::array<char, kMost> text{};
@@ -117,6 +121,7 @@ ValueFacts factsOf(const CurrentValues& values, const FieldInfo& field, const Le
     }
     if (value != nullptr) {
         facts.text = value->value.text();
+        facts.standing = standingOf(field, value->value);
         facts.knowledge = knowledgeOf(values, field, value->value, names);
         if (borders != profile.borders.end() && std::isfinite(value->value.number)) {
             facts.grade = borders->second.gradeOf(value->value.number);

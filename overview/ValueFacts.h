@@ -1,5 +1,6 @@
 #pragma once
 
+#include "fields/Standing.h"
 #include "knowledge/Networks.h"
 #include "knowledge/Quality.h"
 #include "timeline/LeafField.h"
@@ -13,7 +14,8 @@ namespace pallax {
 
 /// What can be said about one value of the display.
 struct ValueFacts {
-    std::string text;           ///< "-92.25 dBm"; empty if there is no value now
+    std::string text; ///< "-92.25 dBm"; empty if there is no value now
+    Standing standing = Standing::Value;
     std::optional<Grade> grade; ///< nothing if the profile does not judge the field
     std::string borders;        ///< "android: poor -115, fair -105, good -95, excellent -85"
     std::string meaning;        ///< a sentence
@@ -26,6 +28,8 @@ struct ValueFacts {
 ValueFacts factsOf(const CurrentValues& values, const FieldInfo& field, const LeafValue* value,
                    const Reading* reading, const NetworkNames& names,
                    const QualityProfile& profile);
+
+Standing standingOf(const FieldInfo& field, const FieldValue& value);
 
 /// What is known about a value beside the modem: the band of a channel, the name of a network, the
 /// parts of an identity.

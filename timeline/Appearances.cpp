@@ -44,6 +44,7 @@ public:
         return isDone;
     }
     const std::vector<Appearance>& all() const { return _all; }
+    bool isFull() const { return _isCut || _all.size() >= kMost; }
 
 private:
     /// What was seen of a field in one entry.
@@ -59,10 +60,14 @@ private:
         const auto [seen, isFirst] =
             _seen.try_emplace(std::uint64_t{entry} << 32U | field, Seen{value.shown, {}});
         const bool isSame = !isFirst && seen->second.latest == value.shown;
-        if (isSame || (!isFirst && std::isfinite(value.number))) {
+        if (isSame) {
             return;
         }
         seen->second.latest = value.shown;
+        if (std::isfinite(value.number) && seen->second.texts.size() == kMostNumbers) {
+            _isCut = true;
+            return;
+        }
         std::string text = value.text();
         if (_all.size() < kMost && seen->second.texts.insert(text).second) {
             _all.push_back(
@@ -74,6 +79,7 @@ private:
     std::uint64_t _read = 0; ///< the latest packet that was read
     std::unordered_map<std::uint64_t, Seen> _seen;
     std::vector<Appearance> _all; ///< by packet
+    bool _isCut = false;          ///< a field had too many numbers
 };
 
 Appearances::Appearances() = default;
@@ -87,7 +93,7 @@ bool Appearances::read(Timeline& timeline, const MayContinue& mayContinue) {
 }
 
 bool Appearances::isFull() const {
-    return _reader != nullptr && _reader->all().size() >= kMost;
+    return _reader != nullptr && _reader->isFull();
 }
 
 std::vector<Appearances::Hit> Appearances::find(const Timeline& timeline,

@@ -12,12 +12,13 @@
 
 namespace pallax {
 
-/// Where the fields of a recording and their texts appear first. Numbers count only as the first
-/// value of their field and entry.
+/// Where the fields of a recording and their texts appear first, numbers included.
 class Appearances {
 public:
     /// The most that are kept; later ones are left out.
     static constexpr std::size_t kMost = 65536;
+    /// Of a field in one entry, the most numbers: a counter has another one in each packet.
+    static constexpr std::size_t kMostNumbers = 1000;
 
     /// Something that a search has found.
     struct Hit {

@@ -81,6 +81,18 @@ std::uint64_t Timeline::instantIn(const Stretch& stretch, Time time) const {
     return instant;
 }
 
+void Timeline::add(Event event) {
+    const auto isBefore = [](const Event& a, const Event& b) { return a.packet < b.packet; };
+    const auto [first, last] = std::equal_range(_events.begin(), _events.end(), event, isBefore);
+    const bool isThere = std::any_of(first, last, [&event](const Event& each) {
+        return each.kind == event.kind && each.words == event.words;
+    });
+    const bool isDropped = _eventsDropped != 0 && last == _events.begin();
+    if (!isThere && !isDropped) {
+        _events.insert(last, std::move(event));
+    }
+}
+
 std::vector<std::string> Timeline::notes() const {
     std::vector<std::string> notes;
     if (_fields.isFull()) {
@@ -96,7 +108,9 @@ std::vector<std::string> Timeline::notes() const {
         notes.push_back(std::move(*trouble));
     }
     if (_hasEnded) {
-        const Event& fatal = _events.back();
+        const Event& fatal = *std::find_if(_events.rbegin(), _events.rend(), [](const Event& each) {
+            return each.kind == EventKind::FatalRecord;
+        });
         notes.push_back(formatText("Packet %llu cannot be read: %@", {fatal.packet, fatal.words}));
     }
     return notes;

@@ -78,7 +78,10 @@ public:
     const EntryTable& entries() const { return _entries; }
     const SeriesStore& series() const { return _series; }
     const KeyFrames& keyFrames() const { return _keyFrames; }
-    /// The latest events, in their order.
+    /// Adds an event that its packets do not tell, such as an alarm, after those of its packet.
+    /// Nothing happens if it is there already, or too early.
+    void add(Event event);
+    /// The latest events, in the order of their packets.
     const std::vector<Event>& events() const { return _events; }
     /// How many earlier ones there were no room for.
     std::uint64_t eventsDropped() const { return _eventsDropped; }

@@ -24,6 +24,11 @@ TEST_F(EndToEndScreenAlarms, AnAlarmIsInTheTitleAndAmongTheEventsAndRingsTheBell
     terminal.type("o");
     EXPECT_TRUE(terminal.shows("alarm: last cell"));
     EXPECT_EQ(terminal.screen().text().find("never"), std::string::npos);
+    terminal.type("oe");
+    EXPECT_TRUE(terminal.shows("› Events"));
+    EXPECT_TRUE(terminal.shows("alarm: last cell"));
+    terminal.type("/alarm:\r\r"); // goes to the only row
+    EXPECT_TRUE(terminal.shows("held"));
     terminal.type("q");
     EXPECT_EQ(terminal.wait(), 0);
 }
@@ -49,6 +54,15 @@ TEST_F(EndToEndScreenAlarms, ARuleWithoutItsFieldIsToldOnTheScreen) {
     EXPECT_EQ(terminal.screen().text().find("no such column"), std::string::npos) << "told once";
     terminal.type("q");
     EXPECT_EQ(terminal.wait(), 0);
+}
+
+TEST_F(EndToEndScreenAlarms, ARuleWithoutItsFieldIsToldOnStandardErrorWhereTheTreeIsPrinted) {
+    arm("alarm = other: mm_state is null\n"
+        "alarm = weak: measured_rsrp < -110\n");
+    const Run run = this->run({lteDrive(), "--print", "--speed", "max"});
+    EXPECT_EQ(run.status, 0);
+    EXPECT_EQ(run.err, "pallax: Alarms that are left out: other: no such column: mm_state "
+                       "(line 1, column 1 of the condition).\n");
 }
 
 TEST_F(EndToEndScreenAlarms, AWrongRuleEndsTheProgram) {

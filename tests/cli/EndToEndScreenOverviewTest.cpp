@@ -18,7 +18,7 @@ TEST_F(EndToEndScreen, TheOverviewShowsTheServingCellAndGoesBackToThePanes) {
     EXPECT_TRUE(terminal.shows("Events      22:15:19  serving cell 286 → 184 after 4 s"));
     terminal.type(kEscape);
     EXPECT_TRUE(terminal.shows("Pallax › Neighbor Cells List"));
-    terminal.type("qoq");
+    terminal.type("qoqq");
     EXPECT_EQ(terminal.wait(), 0);
     EXPECT_TRUE(terminal.isRestored());
     EXPECT_EQ(terminal.screen().unknown(), "");
@@ -36,7 +36,7 @@ TEST_F(EndToEndScreen, TheOverviewOfAnAsciiTerminalIsAscii) {
     for (const char character : terminal.settled()) {
         EXPECT_EQ(static_cast<unsigned char>(character) & 0x80U, 0U);
     }
-    terminal.type("q");
+    terminal.type("qq");
     EXPECT_EQ(terminal.wait(), 0);
 }
 
@@ -47,7 +47,7 @@ TEST_F(EndToEndScreen, TheOverviewFollowsTheModelAfterAFreshStart) {
     EXPECT_TRUE(terminal.showsNoMore("End of the recording"));
     EXPECT_TRUE(terminal.shows("End of the recording"));
     EXPECT_TRUE(terminal.shows("PCI 184 · TAC 6699"));
-    terminal.type("q");
+    terminal.type("qq");
     EXPECT_EQ(terminal.wait(), 0);
 }
 
@@ -58,7 +58,7 @@ TEST_F(EndToEndScreen, TheOverviewIsTheFirstScreenIfTheSettingsSaySo) {
     EXPECT_TRUE(terminal.shows("PCI 184 · TAC 6699"));
     terminal.type("o");
     EXPECT_TRUE(terminal.shows("▌Serving Cell Info"));
-    terminal.type("q");
+    terminal.type("qq");
     EXPECT_EQ(terminal.wait(), 0);
 }
 
@@ -96,7 +96,49 @@ TEST_F(EndToEndScreen, QueriesShareTheirHistoryWithTheShellOfSql) {
     EXPECT_TRUE(terminal.shows("▌Serving Cell Info"));
     terminal.type("e");
     EXPECT_TRUE(terminal.shows("Pallax › Events"));
-    terminal.type("q");
+    terminal.type("qq");
+    EXPECT_EQ(terminal.wait(), 0);
+}
+
+TEST_F(EndToEndScreen, LevelsAreJudgedByTheProfileOfTheSettingsOrTheOption) {
+    std::ofstream(world.path("config/pallax/pallax.conf"))
+        << "first-screen = overview\nprofile = field\n";
+    PallaxTerminal field(world, {lteDrive(), "--speed", "max"}, {});
+    EXPECT_TRUE(field.shows("quality by the profile field"));
+    field.type("qq");
+    EXPECT_EQ(field.wait(), 0);
+    PallaxTerminal other(world, {lteDrive(), "--speed", "max", "--profile", "operator"}, {});
+    EXPECT_TRUE(other.shows("quality by the profile operator"));
+    other.type("o/cell meas\r\r/measured rsrp\r\r");
+    EXPECT_TRUE(other.shows("operator: poor -110, fair -95"));
+    other.type("qqq");
+    EXPECT_EQ(other.wait(), 0);
+}
+
+TEST_F(EndToEndScreen, AProfileThatIsMissingEndsTheProgram) {
+    const Run wrong = run({lteDrive(), "--print", "--profile", "nobody"});
+    EXPECT_EQ(wrong.status, 2);
+    EXPECT_EQ(wrong.out, "");
+    EXPECT_NE(wrong.err.find("nobody"), std::string::npos) << wrong.err;
+    std::ofstream(world.path("config/pallax/pallax.conf")) << "profile = nobody\n";
+    const Run set = run({lteDrive(), "--print"});
+    EXPECT_EQ(set.status, 1);
+    EXPECT_EQ(set.err, wrong.err);
+}
+
+TEST_F(EndToEndScreen, AValueWithoutALabelIsOutOfRange) {
+    constexpr unsigned kNoState = 99;
+    PallaxTerminal terminal(
+        world,
+        {record("odd.pcap", {{std::chrono::milliseconds(0), registration(kNoState)}}), "--speed",
+         "max"},
+        {});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    terminal.type("/process co\r\r");
+    EXPECT_TRUE(terminal.shows("out of range  Unknown"));
+    terminal.type("/unknown\r\r");
+    EXPECT_TRUE(terminal.shows("Unknown  out of range"));
+    terminal.type("qqq");
     EXPECT_EQ(terminal.wait(), 0);
 }
 

@@ -32,6 +32,15 @@ TEST_F(EndToEndTerminal, ResizingIsSafeAtAnyMoment) {
     EXPECT_EQ(terminal.wait(), 0);
 }
 
+/// Whether the latest request for reports of the mouse came after the latest that ends them.
+bool reportsMouse(const std::string& bytes) {
+    const auto last = [&bytes](const char* request) {
+        const std::size_t at = bytes.rfind(request);
+        return at == std::string::npos ? -1 : static_cast<std::ptrdiff_t>(at);
+    };
+    return last("\x1b[?1002h") > last("\x1b[?1002l");
+}
+
 TEST_F(EndToEndTerminal, ItIsSuspendedAndComesBack) {
     PallaxTerminal terminal(world, {"--norc", "--noprofile", "-i"}, {.program = "/bin/bash"});
     ASSERT_TRUE(terminal.shows("$"));
@@ -39,12 +48,17 @@ TEST_F(EndToEndTerminal, ItIsSuspendedAndComesBack) {
     ASSERT_TRUE(terminal.shows("Process CO")); // the rest may follow later
     terminal.type("\x1a");
     ASSERT_TRUE(terminal.shows("Stopped"));
+    EXPECT_FALSE(reportsMouse(terminal.bytes()));
     EXPECT_FALSE(terminal.screen().isOnOtherScreen());
     (void)terminal.settled(); // the shell drops keys typed before its prompt
     terminal.type("fg\r");
     EXPECT_TRUE(terminal.showsNoMore("Stopped"));
     EXPECT_TRUE(terminal.shows("Process CO"));
     EXPECT_TRUE(terminal.screen().isOnOtherScreen());
+    EXPECT_TRUE(doubles::eventually([&terminal] {
+        (void)terminal.settled();
+        return reportsMouse(terminal.bytes());
+    }));
     terminal.type("q");
     EXPECT_TRUE(terminal.shows("$"));
     terminal.type("exit\r");
@@ -153,7 +167,7 @@ TEST_F(EndToEndTerminal, QualityHasTheColoursThatTheTerminalHas) {
                                   terminal.screen().colorOf("good") + " " +
                                   terminal.screen().colorOf("-12.62 dB");
         EXPECT_EQ(terminal.screen().unknown(), "") << type;
-        terminal.type("q");
+        terminal.type("qq");
         EXPECT_EQ(terminal.wait(), 0);
         return found;
     };

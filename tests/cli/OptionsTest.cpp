@@ -52,6 +52,12 @@ TEST(Options, ColourAndMouseAreTheTerminalsUnlessToldOtherwise) {
               "pallax: --color: \"blue\" is not one of auto|always|never (see pallax --help)\n");
 }
 
+TEST(Options, TheProfileOfTheScreenIsThatOfTheSettingsUnlessToldOtherwise) {
+    EXPECT_EQ(parsed<BrowseOptions>({"a.pcap"}).profile, std::nullopt);
+    EXPECT_EQ(parsed<BrowseOptions>({"a.pcap", "--profile", "field"}).profile, "field");
+    EXPECT_EQ(parsed<BrowseOptions>({"demo", "--profile=survey"}).profile, "survey");
+}
+
 TEST(Options, ARecordingNamedLikeACommandIsGivenWithItsFolder) {
     EXPECT_EQ(recordingPath(parsed<BrowseOptions>({"./decode"}).source), "./decode");
 }

@@ -18,6 +18,12 @@ std::string sentenceFor(std::string_view text) {
     return settings ? "no error" : settings.error().sentence;
 }
 
+TEST(Settings, AProfileIsItsName) {
+    EXPECT_EQ(parseSettings("", "pallax.conf")->profile, std::nullopt);
+    EXPECT_EQ(parseSettings("profile = survey", "pallax.conf")->profile, "survey");
+    EXPECT_EQ(sentenceFor("profile ="), "pallax.conf, line 1: profile needs a name.");
+}
+
 TEST(Settings, AreReadLineByLine) {
     const auto settings = parseSettings("# a comment\n"
                                         "\n"

@@ -73,6 +73,21 @@ TEST(Status, ACellHasItsIdentityChannelBandAndFrequency) {
     EXPECT_EQ(status.profile, "android");
 }
 
+TEST(Status, TheCarrierHasItsUplinkAndWhatElseTheModemTells) {
+    ValuesFixture lte("lte");
+    lte.read(0, {{"Serving Cell Info", Dictionary{{"Download Frequency", "1850"},
+                                                  {"Upload Frequency", "19850"},
+                                                  {"Download Bandwidth", "20 MHz"},
+                                                  {"Num Tx Antennas", "2"}}}});
+    EXPECT_EQ(statusAt(1, lte).cells.front().details,
+              (Lines{"uplink 1775.0 MHz", "bandwidth 20 MHz", "antenna ports 2"}));
+    lte.read(2, {{"Serving Cell Info", Dictionary{{"Upload Frequency", "65535"},
+                                                  {"Download Bandwidth", "Unknown"},
+                                                  {"Num Tx Antennas", "2"}}}});
+    EXPECT_EQ(statusAt(3, lte).cells.front().details,
+              (Lines{"uplink channel 65535", "antenna ports 2"}));
+}
+
 TEST(Status, OfUmtsACellIsThatOfAController) {
     ValuesFixture gsm("gsm");
     gsm.read(0, {{"UMTS RR Info", Dictionary{{"Cell ID", "10748279"}}},

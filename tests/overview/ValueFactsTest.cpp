@@ -75,6 +75,22 @@ TEST(ValueFacts, TellWhereANumberWasRead) {
     EXPECT_EQ(*timeOf(lte.timeline(), reading->packet), value.read);
 }
 
+TEST(ValueFacts, TellWhetherTheValueAppliesAndIsInItsRange) {
+    FactsOf lte("lte");
+    const auto field =
+        *lte.timeline().fields().named("lte.serving_cell_measurements.measured_rsrp");
+    const FieldInfo& rsrp = lte.timeline().fields()[field];
+    LeafValue value{field, kNoEntry, {"-92.00 dBm", -92.0, 192, {}}};
+    const auto standing = [&] {
+        return factsOf(lte.values(), rsrp, &value, nullptr, lte.names,
+                       *builtInProfile(kDefaultProfile))
+            .standing;
+    };
+    EXPECT_EQ(standing(), Standing::Value);
+    value.value.number = -8.0; // its 9 bits end at -12.25
+    EXPECT_EQ(standing(), Standing::OutOfRange);
+}
+
 TEST(ValueFacts, WithoutAReadingTheyHaveOnlyTheLogCodes) {
     FactsOf lte("lte");
     const ValueFacts facts = lte.at("/Serving Cell Measurements/Physical Cell ID", false);

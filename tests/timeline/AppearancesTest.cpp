@@ -5,6 +5,7 @@
 
 #include <gtest/gtest.h>
 
+#include <map>
 #include <string>
 #include <vector>
 
@@ -50,6 +51,24 @@ TEST_F(AppearancesTest, ATextAppearsWhereItIsReadFirst) {
         }
     }
     EXPECT_TRUE(isFound);
+}
+
+TEST_F(AppearancesTest, ANumberAppearsWhereItIsReadFirst) {
+    const auto field = timeline->fields().named("utran.serving_cell_info.cell_scrambling_code");
+    ASSERT_TRUE(field);
+    const auto series = readSeries(*timeline, *field, kNoEntry, 1, timeline->packets());
+    std::map<std::string, std::uint64_t> expected;
+    for (const SeriesPoint& point : series) {
+        expected.emplace(point.value.text(), point.packet);
+    }
+    ASSERT_GT(expected.size(), 1U);
+    std::map<std::string, std::uint64_t> seen;
+    for (const Appearances::Hit& hit : found("")) {
+        if (hit.name == "Cell Scrambling Code" && hit.where == "Serving Cell Info") {
+            EXPECT_TRUE(seen.emplace(hit.value, hit.packet).second) << hit.value;
+        }
+    }
+    EXPECT_EQ(seen, expected);
 }
 
 TEST_F(AppearancesTest, AFieldAppearsOnceForEachEntry) {

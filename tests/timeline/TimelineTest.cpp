@@ -234,5 +234,26 @@ TEST(Timeline, TooManyPathsAreTold) {
     EXPECT_FALSE(timeline->fields().named("ifx.p4095"));
 }
 
+TEST(Timeline, AnAddedEventStandsAfterThoseOfItsPacketOnce) {
+    TimelineFixture fixture{"lte"};
+    fixture.drive(5, std::chrono::seconds(120));
+    const auto timeline = fixture.indexed();
+    const std::size_t before = timeline->events().size();
+    ASSERT_GT(before, 2U);
+    const Event& second = timeline->events()[1];
+    const Event alarm{EventKind::Alarm, second.time, second.packet, "alarm: weak", {}};
+    timeline->add(alarm);
+    timeline->add(alarm);
+    ASSERT_EQ(timeline->events().size(), before + 1);
+    std::size_t at = 0;
+    while (timeline->events()[at].kind != EventKind::Alarm) {
+        ++at;
+    }
+    EXPECT_EQ(timeline->events()[at - 1].packet, alarm.packet);
+    for (std::size_t index = 1; index < timeline->events().size(); ++index) {
+        EXPECT_LE(timeline->events()[index - 1].packet, timeline->events()[index].packet);
+    }
+}
+
 } // namespace
 } // namespace pallax

@@ -161,10 +161,7 @@ int Bars::drawTimeBar(const TimeBar& bar) {
         _grid.put(columnOfPlace(*bar.marked), y, _marks.timeMark, {.tint = Tint::Purple});
     }
     _grid.put(columnOfPlace(bar.shown), y, _marks.timeShown, {.accent = true});
-    for (int place = 0; place < length; ++place) {
-        const double share = static_cast<double>(place) / (length - 1);
-        _hits.add(first + place, y, 1, 1, [go = bar.go, share] { go(share); });
-    }
+    _hits.add(y, {first, length, bar.go});
     x = _grid.put(first + length, y, _marks.timeEnd, kSecondary);
     return _grid.put(x + 1, y, bar.clock);
 }

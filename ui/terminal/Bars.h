@@ -48,7 +48,7 @@ struct TimeBar {
     std::optional<double> marked = {};
     std::vector<double> events = {};
     bool isPlaying = false;
-    std::function<void(double)> go = [](double) {}; ///< by a click
+    std::function<void(double)> go = [](double) {}; ///< by a click or by dragging
 };
 
 /// What is shown around the content besides the pane's own items.
@@ -64,6 +64,10 @@ struct PaneStatus {
     std::vector<std::string> alarms; ///< the names of those that are true; in the title
     std::string zone;                ///< for the time in the status text
     std::function<void(const KeyEvent&)> press = [](const KeyEvent&) {}; ///< by a click
+    /// What the value at a path of the display says about itself: "out of range", or nothing.
+    std::function<std::string_view(const std::string&)> standing = [](const std::string&) {
+        return std::string_view();
+    };
     /// The curve of the value at a path of the display in so many columns; empty if it has none.
     std::function<std::string(const std::string&, int)> curve = [](const std::string&, int) {
         return std::string();

@@ -54,30 +54,9 @@ constexpr auto kSequences = std::to_array<Sequence>({
     {"6", U'~', Key::PageDown},
 });
 
-std::optional<KeyEvent> mouseEvent() {
-    MEVENT event{};
-    if (::getmouse(&event) != OK) {
-        return std::nullopt;
-    }
-    KeyEvent key{.character = 0, .x = event.x, .y = event.y};
-    if ((event.bstate & BUTTON4_PRESSED) != 0) {
-        key.key = Key::WheelUp;
-    } else if ((event.bstate & BUTTON5_PRESSED) != 0) {
-        key.key = Key::WheelDown;
-    } else if ((event.bstate & BUTTON1_PRESSED) != 0) {
-        key.key = Key::Click;
-    } else {
-        return std::nullopt;
-    }
-    return key;
-}
-
 } // namespace
 
 std::optional<KeyEvent> keyOfCode(unsigned code) {
-    if (code == KEY_MOUSE) {
-        return mouseEvent();
-    }
     const auto* found = std::find_if(kCodes.begin(), kCodes.end(),
                                      [code](const Code& known) { return known.code == code; });
     if (found == kCodes.end()) {

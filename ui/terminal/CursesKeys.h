@@ -7,8 +7,7 @@
 
 namespace pallax::terminal {
 
-/// The event of a curses key code; nothing for an unused code. Takes mouse events from the
-/// library's queue.
+/// The event of a curses key code; nothing for an unused code.
 std::optional<KeyEvent> keyOfCode(unsigned code);
 
 /// The event of a typed character, some of which are keys.

@@ -5,6 +5,7 @@
 #include "ui/terminal/Curses.h"
 #include "ui/terminal/CursesCapability.h"
 #include "ui/terminal/CursesKeys.h"
+#include "ui/terminal/MouseReports.h"
 #include "ui/terminal/TerminalRestorer.h"
 #include "ui/terminal/Tints.h"
 
@@ -40,11 +41,10 @@ using OwnedFile = std::unique_ptr<std::FILE, FileCloser>;
 /// The sequence that restores the screen: attributes off, cursor visible, keypad and mouse off,
 /// normal screen.
 std::string restoringSequence() {
-    constexpr std::string_view kMouseOff = "\x1b[?1000l\x1b[?1002l\x1b[?1003l\x1b[?1006l";
     std::string sequence =
         terminalCapability("sgr0") + terminalCapability("cnorm") + terminalCapability("rmkx");
     if (!terminalCapability("kmous").empty()) {
-        sequence += kMouseOff;
+        sequence += kNoMouseReports;
     }
     return sequence + terminalCapability("rmcup") + "\r\n";
 }
@@ -76,6 +76,18 @@ bool isPlainLocale() {
     return std::string_view(::nl_langinfo(CODESET)) == "ANSI_X3.4-1968";
 }
 
+/// The event of a report in three characters, which are read now.
+std::optional<KeyEvent> mouseEventAfterM() {
+    std::array<wint_t, 3> characters{};
+    bool isComplete = true;
+    for (wint_t& character : characters) {
+        isComplete = isComplete && ::get_wch(&character) == OK;
+    }
+    ::nodelay(::stdscr, TRUE);
+    return isComplete ? mouseEventOfCharacters(characters[0], characters[1], characters[2])
+                      : std::nullopt;
+}
+
 /// The key after an escape character that the library has read on its own: the rest of a control
 /// sequence that it does not know, or nothing.
 std::optional<KeyEvent> keyAfterEscape() {
@@ -89,13 +101,18 @@ std::optional<KeyEvent> keyAfterEscape() {
         ::unget_wch(static_cast<wchar_t>(code)); // a key pressed right after the other
         return keyOfCharacter(kEscape);
     }
+    const bool isControl = code == U'[';
     std::string parameters;
     ::wtimeout(::stdscr, kEscapeDelay);
     while (::get_wch(&code) == OK && code < kFirstFinal) {
         parameters += static_cast<char>(code);
     }
+    if (isControl && parameters.empty() && code == U'M') {
+        return mouseEventAfterM();
+    }
     ::nodelay(::stdscr, TRUE);
-    return keyOfSequence(parameters, code);
+    return parameters.starts_with('<') ? mouseEvent(parameters, code)
+                                       : keyOfSequence(parameters, code);
 }
 
 bool wantsColor(ColorUse use) {
@@ -129,6 +146,8 @@ struct CursesTerminal::Impl {
     std::array<short, kTints> tintPairs{}; ///< 0, the default colours, where a tint has none
     bool isUtf8 = false;
     std::unique_ptr<TerminalRestorer> restorer;
+    std::optional<MouseReports> mouseReports;
+    std::optional<KeyEvent> readAhead; ///< after the last position of a drag
 
     attr_t attributesOf(Style style) const {
         attr_t attributes = A_NORMAL;
@@ -206,9 +225,9 @@ CursesTerminal::open(const Options& options) {
     if (wantsColor(options.color) && ::has_colors() && ::start_color() == OK) {
         impl->startColors();
     }
-    if (options.mouse) {
-        ::mousemask(BUTTON1_PRESSED | BUTTON4_PRESSED | BUTTON5_PRESSED, nullptr);
-        ::mouseinterval(0); // report a press at once
+    ::keyok(KEY_MOUSE, FALSE); // its sequences are read below
+    if (options.mouse && !terminalCapability("kmous").empty()) {
+        impl->mouseReports.emplace();
     }
     return std::unique_ptr<CursesTerminal>(new CursesTerminal(std::move(impl)));
 }
@@ -216,6 +235,7 @@ CursesTerminal::open(const Options& options) {
 CursesTerminal::CursesTerminal(std::unique_ptr<Impl> impl) : _impl(std::move(impl)) {}
 
 CursesTerminal::~CursesTerminal() {
+    _impl->mouseReports.reset();
     ::endwin();
     ::delscreen(_impl->screen);
 }
@@ -240,6 +260,9 @@ void CursesTerminal::adoptSize() {
     winsize size{};
     if (::ioctl(STDOUT_FILENO, TIOCGWINSZ, &size) == 0 && size.ws_row > 0 && size.ws_col > 0) {
         ::resizeterm(size.ws_row, size.ws_col);
+    }
+    if (_impl->mouseReports) {
+        MouseReports::ask();
     }
 }
 
@@ -266,6 +289,19 @@ void CursesTerminal::repaint() {
 }
 
 std::optional<KeyEvent> CursesTerminal::read() {
+    std::optional<KeyEvent> event =
+        _impl->readAhead ? std::exchange(_impl->readAhead, std::nullopt) : readOne();
+    while (event && event->key == Key::Drag) {
+        _impl->readAhead = readOne();
+        if (!_impl->readAhead || _impl->readAhead->key != Key::Drag) {
+            break;
+        }
+        event = std::exchange(_impl->readAhead, std::nullopt);
+    }
+    return event;
+}
+
+std::optional<KeyEvent> CursesTerminal::readOne() {
     wint_t code = 0;
     for (;;) {
         const int kind = ::get_wch(&code);

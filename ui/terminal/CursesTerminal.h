@@ -44,12 +44,12 @@ public:
     /// Readable when a key may be waiting.
     int inputDescriptor() const;
 
-    /// Call this when the extent may have changed.
+    /// Call this when the extent may have changed, and after the program was suspended.
     void adoptSize();
     void show(const Grid& grid);
     /// The contents of the screen are unknown: the next `show` draws all of it.
     void repaint();
-    /// The next key; nothing when none is waiting.
+    /// The next key; nothing when none is waiting. Of a drag, only the latest position.
     std::optional<KeyEvent> read();
     /// Whether the other end of the terminal has gone.
     bool isHungUp() const;
@@ -60,6 +60,7 @@ public:
 private:
     struct Impl;
     explicit CursesTerminal(std::unique_ptr<Impl> impl);
+    static std::optional<KeyEvent> readOne();
     std::unique_ptr<Impl> _impl;
 };
 

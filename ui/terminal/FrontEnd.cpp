@@ -79,6 +79,7 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .alarms = _alarms,
                             .zone = _surroundings.zone(),
                             .press = [this](const KeyEvent& event) { handle(event); },
+                            .standing = [this](const auto& path) { return standingOfRow(path); },
                             .curve = [this](const std::string& path,
                                             int columns) { return curveOfRow(path, columns); }};
     if (_pages.isOpen()) {
@@ -155,6 +156,13 @@ void FrontEnd::handle(const KeyEvent& event) {
     if (navigation == nullptr) {
         return;
     }
+    if (event.key == Key::Drag) {
+        return handleDrag(event);
+    }
+    _dragged.reset();
+    if (event.key == Key::Release) {
+        return;
+    }
     if (event.key == Key::Character && event.character == controlKey('l')) {
         _surroundings.repaint();
         return;
@@ -201,9 +209,18 @@ void FrontEnd::handleMouse(const KeyEvent& event) {
         }
         return;
     }
+    _dragged = _hits.sliderAt(event.x, event.y);
     // A copy, because the action may change the screen.
     if (const HitMap::Action action = _hits.at(event.x, event.y)) {
         action();
+        needsDisplay();
+    }
+}
+
+void FrontEnd::handleDrag(const KeyEvent& event) {
+    if (_dragged) {
+        _message.reset();
+        _dragged->moveTo(event.x);
         needsDisplay();
     }
 }
@@ -217,7 +234,7 @@ void FrontEnd::handleAlert(const KeyEvent& event) {
     }
 }
 
-/// The keys for help, a fresh start and quitting work as in a pane.
+/// The keys for help and a fresh start work as in a pane.
 void FrontEnd::handlePage(const KeyEvent& event) {
     if (_pages.handle(event) != PageAnswer::NotMine) {
         return needsDisplay();
@@ -226,10 +243,10 @@ void FrontEnd::handlePage(const KeyEvent& event) {
     if (handleTime(event) || handleNumber(character)) {
         return;
     }
-    if (character == U'q' && !navigation()->isAtRoot()) {
+    if (character == U'q') {
         _pages.closeTop();
         needsDisplay();
-    } else if (character == U'q' || character == U'?' || character == U'R' || character == U'V') {
+    } else if (character == U'?' || character == U'R' || character == U'V') {
         handlePaneCharacter(character);
     }
 }

@@ -64,6 +64,8 @@ public:
         Travel* travel = nullptr;
         /// Shows the modem with this number, from 1, if there is one.
         std::function<void(std::size_t number)> chooseModem = [](std::size_t /*number*/) {};
+        /// Judges levels.
+        std::function<const QualityProfile&()> profile = ShownValues::Source().profile;
 
         ShownValues::Source valueSource() const;
     };
@@ -120,6 +122,8 @@ private:
     void needsDisplay();
     void drawScreen(Grid& grid, TerminalNavigation& navigation);
     void handleMouse(const KeyEvent& event);
+    /// Moves what the mouse button was pressed on.
+    void handleDrag(const KeyEvent& event);
     void handleAlert(const KeyEvent& event);
     void handlePage(const KeyEvent& event);
     /// The key of a number: shows that modem. False for any other key.
@@ -147,6 +151,7 @@ private:
     bool findAgain(const KeyEvent& event);
     void findRowAgain(bool isForward);
     void findInstantAgain(bool isForward);
+    std::string_view standingOfRow(const std::string& path);
     std::string curveOfRow(const std::string& path, int columns);
     Overview overviewWithCurves();
     void goBack(TerminalTable& table);
@@ -163,6 +168,7 @@ private:
     Surroundings _surroundings;
     const Marks& _marks;
     HitMap _hits;
+    std::optional<Slider> _dragged; ///< while the mouse button is held on it
     TerminalToolkit _toolkit;
     ModalKeys _modalKeys;
     mutable TimeControl _time;

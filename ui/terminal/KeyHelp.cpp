@@ -43,7 +43,7 @@ constexpr auto kKeyHelp = std::to_array<KeyHelp>({
     {"1-9", "one of several modems", kModems},
     {"Ctrl-N", "the next of several modems", kModems},
     {"Tab", "next field on the save screen", kSave},
-    {"Click, wheel", "open the row; scroll"},
+    {"Click, wheel", "open; scroll; drag time bar"},
     {"Ctrl-L", "redraw the screen"},
     {"Ctrl-Z", "suspend; fg resumes"},
     {"?", "this help"},

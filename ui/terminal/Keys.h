@@ -19,6 +19,8 @@ enum class Key {
     Home,
     End,
     Click,
+    Drag,    ///< the mouse was moved while its button was held
+    Release, ///< of the mouse button
     WheelUp,
     WheelDown,
 };

@@ -178,6 +178,7 @@ std::vector<Block> Blocks::cells() const {
         block.rows = wrapped(words);
         if (cell.channel) {
             words = channelWords(cell);
+            words.insert(words.end(), cell.details.begin(), cell.details.end());
             words.push_back(oldAgeWords(_status.time, {&*cell.channel}));
             for (TextRow& row : wrapped(words)) {
                 block.rows.push_back(std::move(row));

@@ -78,6 +78,11 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return _surroundings.startAfresh();
     case U'q':
         return navigation()->isAtRoot() ? _surroundings.quit() : navigation()->back();
+    case U't':
+        if (!pane.isListWithColumns()) {
+            return setMessage("Nothing to show as a table: choose a list.");
+        }
+        return pane.handleListKey(character);
     default:
         return handleNumber(character) ? void() : pane.handleListKey(character);
     }

@@ -177,7 +177,10 @@ void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y, const Pan
     const std::shared_ptr<ui::TableCell> cell = table.source().cellForRow(index);
     const PaneRow row = pane.row(index);
     const bool isSelected = shown == pane.cursor();
-    drawCell(table, *cell, row, y, isSelected);
+    const bool isLeaf = !row.isBranch;
+    const std::string_view standing =
+        isLeaf ? status.standing(childPath(pane.path(), row.name)) : std::string_view();
+    drawCell(table, *cell, row, y, isSelected, standing);
     if (row.number && _grid.columns() >= kLeastColumnsForCurves) {
         drawCurve(cell->contents(), status, childPath(pane.path(), row.name), y);
     }
@@ -191,7 +194,7 @@ void PaneView::drawRow(TerminalTable& table, std::size_t shown, int y, const Pan
 }
 
 void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const PaneRow& row, int y,
-                        bool isSelected) {
+                        bool isSelected, std::string_view standing) {
     const ui::CellContents contents = cell.contents();
     const std::string count = row.elements ? std::to_string(*row.elements) : "";
     // A count is at the end of the text area, after a blank.
@@ -228,6 +231,9 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const P
     } else if (row.hasChanged) {
         _grid.put(last, y, _marks.changed, kBold);
     }
+    if (!row.overdue && !standing.empty()) {
+        (void)drawNote(standing, y, {nameEnd, valueStart});
+    }
     if (row.overdue) {
         drawAge(*row.overdue, y, {nameEnd, row.isBranch ? last - 1 - columnsOf(count) : valueStart},
                 row.isBranch ? last - 1 : last);
@@ -236,13 +242,19 @@ void PaneView::drawCell(const TerminalTable& table, ui::TableCell& cell, const P
 
 /// Between the name and the value or count. Without room, a mark stands in a column beside.
 void PaneView::drawAge(std::chrono::nanoseconds age, int y, Span room, int markColumn) {
-    const std::string text = ageText(age);
-    const int left = room.right - kGap - columnsOf(text);
-    if (left >= room.left + kGap) {
-        _grid.put(left, y, text, kDim);
-    } else {
+    if (!drawNote(ageText(age), y, room)) {
         _grid.put(markColumn, y, _marks.old, kDim);
     }
+}
+
+/// At the end of the room; false if it does not fit.
+bool PaneView::drawNote(std::string_view text, int y, Span room) {
+    const int left = room.right - kGap - columnsOf(text);
+    const bool fits = left >= room.left + kGap;
+    if (fits) {
+        _grid.put(left, y, text, kDim);
+    }
+    return fits;
 }
 
 /// In the same columns of each row, where name and value leave room.

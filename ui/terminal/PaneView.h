@@ -29,8 +29,9 @@ private:
     void drawCurve(const ui::CellContents& contents, const PaneStatus& status,
                    const std::string& path, int y);
     void drawCell(const TerminalTable& table, ui::TableCell& cell, const PaneRow& row, int y,
-                  bool isSelected);
+                  bool isSelected, std::string_view standing);
     void drawAge(std::chrono::nanoseconds age, int y, Span room, int markColumn);
+    bool drawNote(std::string_view text, int y, Span room);
 
     Grid& _grid;
     const Marks& _marks;

@@ -12,7 +12,8 @@ namespace {
 constexpr std::string_view kTypeSomething = "Type a part of a name or a value.";
 constexpr std::string_view kNotInFrame =
     "Nothing in this frame contains this text. Tab searches the whole recording.";
-constexpr std::string_view kNotInRecording = "No event, name or text of the recording contains it.";
+constexpr std::string_view kNotInRecording =
+    "No event, name or value of the recording contains it.";
 constexpr std::string_view kNothingToSearch = "There is nothing to search yet: no packet has come.";
 constexpr std::string_view kSearching = "The recording is being searched.";
 constexpr std::string_view kSearchStopped = "The search was stopped.";
@@ -54,6 +55,8 @@ void SearchPage::search() {
 void SearchPage::findRows() {
     _root = _surroundings.finder.root();
     _rows = _surroundings.finder.rows(_line.text());
+    _isCut = _rows.size() > TextFinder::kMostHits;
+    _rows.resize(std::min(_rows.size(), TextFinder::kMostHits));
     TableContent table{{{"Name", {}, true}, {"Value"}, {"Where"}}, {}, "hit", "hits"};
     for (const FoundRow& row : _rows) {
         std::string key;
@@ -72,6 +75,7 @@ void SearchPage::findInstants() {
     _isSearching = false;
     const std::chrono::seconds ahead = _surroundings.ahead();
     TableContent table{{{"Time", {}, true}, {"Name"}, {"Value"}, {"Where"}}, {}, "hit", "hits"};
+    _isCut = _instants.hits.size() > TextFinder::kMostHits;
     const std::size_t count = std::min(_instants.hits.size(), TextFinder::kMostHits);
     for (std::size_t index = 0; index < count; ++index) {
         const Appearances::Hit& hit = _instants.hits[index];
@@ -125,7 +129,10 @@ void SearchPage::draw(const PageScreen& screen, const PageSurroundings& around) 
     if (!isFrame && !_isSearching && _instants.isStopped) {
         title += " (stopped)";
     } else if (!isFrame && _instants.isFull) {
-        title += " (not all texts)";
+        title += " (not all values)";
+    }
+    if (_isCut && !_isSearching) {
+        title += " (first 1,000 hits)";
     }
     PageTable::Words words{.title = title, .empty = wordsWithoutRows()};
     if (_isSearching) {

@@ -46,6 +46,7 @@ private:
     NodeRef _root; ///< of the frame that was searched
     std::vector<FoundRow> _rows;
     TextFinder::Instants _instants;
+    bool _isCut = false; ///< there are more hits than are shown
     bool _isSearching = false;
 };
 

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "knowledge/Networks.h"
+#include "knowledge/Quality.h"
 #include "timeline/Curve.h"
 #include "timeline/LeafField.h"
 #include "timeline/Moment.h"
@@ -32,6 +33,11 @@ public:
         std::function<const CurrentValues*()> values;
         std::function<const NetworkNames&()> names;
         std::function<DisplayTime()> time;
+        /// Judges levels.
+        std::function<const QualityProfile&()> profile = []() -> const QualityProfile& {
+            static const QualityProfile usual = *builtInProfile(kDefaultProfile);
+            return usual;
+        };
     };
 
     explicit ShownValues(Source source) : _source(std::move(source)) {}
@@ -44,6 +50,7 @@ public:
     bool hasTimeline() const { return _moment.timeline != nullptr; }
     const CurrentValues* values() const { return _values; }
     const NetworkNames& names() const { return _source.names(); }
+    const QualityProfile& profile() const { return _source.profile(); }
     const DisplayTime& time() const { return _time; }
 
     /// The last reading of a value; null without a timeline.

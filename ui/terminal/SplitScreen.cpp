@@ -19,6 +19,17 @@ bool isMouse(const KeyEvent& event) {
     return event.key == Key::Click || event.key == Key::WheelUp || event.key == Key::WheelDown;
 }
 
+/// What follows a click that gave a side the keyboard.
+bool isDrag(const KeyEvent& event) {
+    return event.key == Key::Drag || event.key == Key::Release;
+}
+
+KeyEvent inside(KeyEvent event, int left) {
+    event.x -= left;
+    event.y -= kListRows;
+    return event;
+}
+
 } // namespace
 
 SplitScreen::SplitScreen(std::vector<Modem> modems, const Marks& marks,
@@ -140,6 +151,10 @@ void SplitScreen::handle(const KeyEvent& event) {
         choose((_current + 1) % _modems.size() + 1);
     } else if (isSplit && isMouse(event)) {
         handleMouse(event);
+    } else if (isSplit && isDrag(event)) {
+        const auto side = std::find_if(_sides.begin(), _sides.end(),
+                                       [this](const Side& each) { return each.modem == _current; });
+        current().handle(inside(event, side->left));
     } else {
         current().handle(event);
     }
@@ -155,10 +170,7 @@ void SplitScreen::handleMouse(const KeyEvent& event) {
     }
     for (const Side& side : std::vector<Side>(_sides)) {
         if (event.x >= side.left && event.x < side.left + side.columns) {
-            KeyEvent inside = event;
-            inside.x -= side.left;
-            inside.y -= kListRows;
-            _modems[side.modem].frontEnd.handle(inside);
+            _modems[side.modem].frontEnd.handle(inside(event, side.left));
             if (event.key == Key::Click) {
                 choose(side.modem + 1); // last, because it makes click areas out of date
             }

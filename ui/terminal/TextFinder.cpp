@@ -8,7 +8,7 @@ namespace pallax::terminal {
 
 std::vector<FoundRow> TextFinder::rows(const std::string& text) const {
     const NodeRef shown = root();
-    return shown != nullptr ? findRows(*shown, text, _surroundings.partAt, kMostHits)
+    return shown != nullptr ? findRows(*shown, text, _surroundings.partAt, kMostHits + 1)
                             : std::vector<FoundRow>();
 }
 

@@ -30,13 +30,13 @@ public:
 
     NodeRef root() const { return _surroundings.root(); }
     Moment moment() const { return _surroundings.moment(); }
-    /// In the shown frame, in the order of the display.
+    /// In the shown frame, in the order of the display; one more than the most if there are more.
     std::vector<FoundRow> rows(const std::string& text) const;
 
     struct Instants {
         std::vector<Appearances::Hit> hits; ///< by packet
         bool isStopped = false;
-        bool isFull = false; ///< not all texts are known
+        bool isFull = false; ///< not all values are known
     };
     /// In the whole recording; nothing for the empty text.
     Instants instants(const std::string& text);

@@ -1,4 +1,5 @@
 #include "fields/Measures.h"
+#include "overview/ValueFacts.h"
 #include "ui/terminal/FrontEnd.h"
 
 #include <chrono>
@@ -29,7 +30,7 @@ std::optional<std::string> textOfRow(const PaneModel& pane, const std::string& n
 } // namespace
 
 ShownValues::Source FrontEnd::Surroundings::valueSource() const {
-    return {moment, values, names, time};
+    return {moment, values, names, time, profile};
 }
 
 /// The leaf under the cursor of the topmost pane; nothing on a branch.
@@ -77,7 +78,7 @@ void FrontEnd::handleValueKey(char32_t character) {
     }
     auto leaf = leafAtCursor();
     if (!leaf) {
-        return;
+        return setMessage("Nothing to show here: choose a value.");
     }
     if (character == U'i') {
         return openValue(std::move(*leaf));
@@ -88,6 +89,14 @@ void FrontEnd::handleValueKey(char32_t character) {
     const auto value = name ? valueOf(*_shown.values(), *name) : std::nullopt;
     const bool isNumber = value && name->inner.empty() && std::isfinite(value->value.number);
     setMessage(isNumber ? _graph.toggle(*name) : "Only numbers have a curve.");
+}
+
+std::string_view FrontEnd::standingOfRow(const std::string& path) {
+    _shown.update();
+    const CurrentValues* values = _shown.values();
+    const auto leaf = values != nullptr ? leafAt(*values, path) : std::nullopt;
+    const auto value = leaf && leaf->inner.empty() ? valueOf(*values, *leaf) : std::nullopt;
+    return value ? nameOf(standingOf(values->fields()[value->field], value->value)) : "";
 }
 
 /// A curve of the last minutes for a row that shows a level; empty for others.

@@ -1,5 +1,6 @@
 #include "ui/terminal/ValuePage.h"
 
+#include "fields/Measures.h"
 #include "overview/StatusWords.h"
 #include "overview/ValueFacts.h"
 #include "ui/terminal/EventText.h"
@@ -24,6 +25,11 @@ std::string joinedBy(std::string_view mark, const std::vector<std::string>& word
         text.append(text.empty() ? "" : mark).append(word);
     }
     return text;
+}
+
+/// Whether a mean of its values says something: not of identifiers and codes.
+bool isMeasured(const FieldInfo& field) {
+    return measureOf(field.name) || !field.unit.empty();
 }
 
 /// "2 s old".
@@ -83,7 +89,7 @@ ValuePage::Content ValuePage::content() {
         const auto value = valueOf(*values, *_name);
         const Reading* reading = value ? _shown.reading(*_name, *value) : nullptr;
         content.facts = factsOf(*values, *content.field, value ? &*value : nullptr, reading,
-                                _shown.names(), *builtInProfile(kDefaultProfile));
+                                _shown.names(), _shown.profile());
         content.read = value ? std::optional(value->value.read) : std::nullopt;
         const bool isNumber = value ? std::isfinite(value->value.number)
                                     : content.field->kind == FieldInfo::Kind::Number;
@@ -142,6 +148,9 @@ std::string ValuePage::drawValue(const PageScreen& screen, const Content& conten
     int x = grid.put(kMargin, kRowsAbove, text, kValueStyle, room);
     if (x > room.right) {
         grid.put(room.right - 1, kRowsAbove, screen.marks.more, kPaleFact);
+    }
+    if (facts.standing != Standing::Value) {
+        x = grid.put(x + kGap, kRowsAbove, nameOf(facts.standing), kPaleFact, room);
     }
     std::string left;
     if (facts.grade) {
@@ -202,12 +211,13 @@ void ValuePage::drawCurve(const PageScreen& screen, const Content& content, int 
     plot.cursor = _keys.cursor();
     drawPlot(grid, screen.marks, plot, area, labels);
     grid.put(kMargin, top + area.rows,
-             eventWords(statistics(plot, plot.curves.front().curve), screen.marks), {},
-             {kMargin, grid.columns() - kMargin});
+             eventWords(statistics(plot, plot.curves.front().curve, *content.field), screen.marks),
+             {}, {kMargin, grid.columns() - kMargin});
 }
 
 /// What the cursor is on, or the least and greatest value.
-std::string ValuePage::statistics(const Plot& plot, const Curve& curve) const {
+std::string ValuePage::statistics(const Plot& plot, const Curve& curve,
+                                  const FieldInfo& field) const {
     const std::string unit = plot.unit.empty() ? "" : " " + plot.unit;
     if (plot.cursor) {
         const CurvePoint* point = pointAt(curve, *plot.cursor);
@@ -229,9 +239,12 @@ std::string ValuePage::statistics(const Plot& plot, const Curve& curve) const {
     }
     constexpr double kHundredths = 100;
     const double mean = sum / static_cast<double>(curve.points.size());
-    return "min " + shortNumber(least) + "  mean " + (curve.isReduced ? "about " : "") +
-           shortNumber(std::round(mean * kHundredths) / kHundredths) + "  max " +
-           shortNumber(most) + unit + "  of " + std::string(_keys.spanWords());
+    const std::string meanWords =
+        isMeasured(field) ? "  mean " + std::string(curve.isReduced ? "about " : "") +
+                                shortNumber(std::round(mean * kHundredths) / kHundredths)
+                          : std::string();
+    return "min " + shortNumber(least) + meanWords + "  max " + shortNumber(most) + unit + "  of " +
+           std::string(_keys.spanWords());
 }
 
 } // namespace pallax::terminal

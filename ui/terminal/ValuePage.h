@@ -39,7 +39,7 @@ private:
 
     Content content();
     std::string title(std::string_view root, const Marks& marks, const Content& content) const;
-    std::string statistics(const Plot& plot, const Curve& curve) const;
+    std::string statistics(const Plot& plot, const Curve& curve, const FieldInfo& field) const;
     std::string drawValue(const PageScreen& screen, const Content& content) const;
     int drawFacts(const PageScreen& screen, const Content& content) const;
     void drawCurve(const PageScreen& screen, const Content& content, int top);

@@ -34,10 +34,6 @@ TEST(CursesKeysTest, OtherCodesMeanNothing) {
     }
 }
 
-TEST(CursesKeysTest, AMouseCodeWithoutAnEventMeansNothing) {
-    EXPECT_FALSE(keyOfCode(KEY_MOUSE).has_value());
-}
-
 TEST(CursesKeysTest, SequencesThatTheTerminalsDescriptionDoesNotTellHaveTheirKeysToo) {
     const std::tuple<const char*, char32_t, Key> expected[] = {
         {"", U'A', Key::Up},      {"", U'B', Key::Down},    {"", U'C', Key::Right},

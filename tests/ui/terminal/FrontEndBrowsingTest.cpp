@@ -226,7 +226,7 @@ TEST_F(FrontEndBrowsingTest, WithoutTheSaveButtonSShowsAMessage) {
 }
 
 TEST_F(FrontEndBrowsingTest, OtherKeysDoNothing) {
-    const std::string known = "jklhgG/foe;ivVsyRq?";
+    const std::string known = "jklhgG/foe;ivVtsyRq?";
     const std::string before = stage.screen();
     const int displays = stage.displays;
     for (char32_t character = 0; character < 0x180; ++character) {

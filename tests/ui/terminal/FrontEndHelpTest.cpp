@@ -53,7 +53,7 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
               │ s                 save a snapshot               │
               │ y                 copy the value                │
               │ R                 reconnect, drop old values    │
-              │ Click, wheel      open the row; scroll          │
+              │ Click, wheel      open; scroll; drag time bar   │
               │ Ctrl-L            redraw the screen             │
               │ Ctrl-Z            suspend; fg resumes           │
               │ ?                 all keys                      │

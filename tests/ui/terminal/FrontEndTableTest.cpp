@@ -117,9 +117,11 @@ TEST_F(FrontEndTableTest, TheSettingOpensListsAsTablesAndTheUsersChoiceHoldsForO
 TEST_F(FrontEndTableTest, OnlyAListHasATable) {
     const std::string before = stage.screen(60, 12);
     const int displays = stage.displays;
-    stage.type("t<>rxX");
+    stage.type("<>rxX");
     EXPECT_EQ(stage.displays, displays);
     EXPECT_EQ(stage.screen(), before);
+    stage.type("t");
+    EXPECT_NE(stage.screen().find("Nothing to show as a table: choose a list."), std::string::npos);
     stage.press(Key::Enter);
     const int rows = stage.displays;
     stage.type("<>rxX"); // rows have no columns

@@ -61,5 +61,29 @@ TEST_F(HitMapTest, AnActionMayChangeTheMapThatItCameFrom) {
     EXPECT_EQ(at(0, 0), "nothing");
 }
 
+TEST_F(HitMapTest, ASliderGoesToThePlaceOfAColumnAndStopsAtItsEnds) {
+    double place = -1.0;
+    map.add(3, Slider{10, 5, [&place](double to) { place = to; }});
+    EXPECT_FALSE(map.sliderAt(9, 3));
+    EXPECT_FALSE(map.sliderAt(10, 4));
+    map.at(11, 3)();
+    EXPECT_EQ(place, 0.25);
+    const auto slider = map.sliderAt(14, 3);
+    ASSERT_TRUE(slider);
+    slider->moveTo(14);
+    EXPECT_EQ(place, 1.0);
+    slider->moveTo(0);
+    EXPECT_EQ(place, 0.0);
+    slider->moveTo(100);
+    EXPECT_EQ(place, 1.0);
+}
+
+TEST_F(HitMapTest, AnAreaOverASliderHidesIt) {
+    map.add(3, Slider{0, 10, [](double) {}});
+    add(0, 0, 10, 10, "above");
+    EXPECT_FALSE(map.sliderAt(5, 3));
+    EXPECT_EQ(at(5, 3), "above");
+}
+
 } // namespace
 } // namespace pallax::terminal

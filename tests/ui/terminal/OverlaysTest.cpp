@@ -130,7 +130,7 @@ TEST(OverlaysTest, TheHelpPageListsTheKeys) {
 │ 1-9               one of several modems         │
 │ Ctrl-N            the next of several modems    │
 │ Tab               next field on the save screen │
-│ Click, wheel      open the row; scroll          │
+│ Click, wheel      open; scroll; drag time bar   │
 │ Ctrl-L            redraw the screen             │
 │ Ctrl-Z            suspend; fg resumes           │
 │ ?                 this help                     │

@@ -54,10 +54,12 @@ TEST_F(OverviewPageTest, TheKeysThatGoBackCloseIt) {
     EXPECT_EQ(stage.depth(), 1U);
 }
 
-TEST_F(OverviewPageTest, QQuitsOverTheFirstPaneAndGoesBackToAnyOther) {
+TEST_F(OverviewPageTest, QClosesItAndQuitsOnlyAtTheFirstPane) {
     stage.type("oq");
+    EXPECT_FALSE(isOpen());
+    EXPECT_EQ(stage.quits, 0);
+    stage.type("q");
     EXPECT_EQ(stage.quits, 1);
-    stage.type("o");
     stage.press(Key::Enter);
     ASSERT_EQ(stage.depth(), 2U);
     stage.type("oq");

@@ -26,7 +26,8 @@ TEST(OverviewText, OfLteFillsTheComfortableScreen) {
  ──────────────────────────────────────────────────────────────────────────────
  Operator    Sample Net 262-42 · home network
  Cell        eNodeB 104475 sector 1 · PCI 184 · TAC 6699
-             EARFCN 1850 · band 3 · 1870.0 MHz
+             EARFCN 1850 · band 3 · 1870.0 MHz · uplink 1775.0 MHz
+             bandwidth 20 MHz · antenna ports 4
  Levels      RSRP  -92.75 dBm  excellent  ▆▆▆▆▁▁▁▁
              RSRQ   -12.62 dB  good       ▆▆▆▁▁▁▁▁
              quality by the profile android
@@ -43,7 +44,6 @@ TEST(OverviewText, OfLteFillsTheComfortableScreen) {
              22:14:42  context up: internet
              22:14:27  context down: internet
              22:14:09  context up: internet
-             22:13:53  context down: internet
  ──────────────────────────────────────────────────────────────────────────────
  Updated 2023-11-14 at 22:13:20                                 o panes  ? help
 )");
@@ -57,6 +57,8 @@ TEST(OverviewText, OnANarrowScreenListsHaveTheirNamesAboveThem) {
  eNodeB 104475 sector 1 · PCI 184
  TAC 6699
  EARFCN 1850 · band 3 · 1870.0 MHz
+ uplink 1775.0 MHz · bandwidth 20 MHz
+ antenna ports 4
  RSRP  -92.75 dBm  excellent  ▆▆▆▆▁▁▁▁
  RSRQ   -12.62 dB  good       ▆▆▆▁▁▁▁▁
  quality by the profile android
@@ -67,9 +69,7 @@ TEST(OverviewText, OnANarrowScreenListsHaveTheirNamesAboveThem) {
  Contexts
  ims Active · internet Active
  Events
- 22:15:19  serving cell 286 → 184 afte…
- 22:15:18  context up: internet
- ──────────────────────────────── ↓ 1 ─
+ ──────────────────────────────── ↓ 3 ─
  Updated 2023-11-14 at 22:13:20  ? help
 )");
 }
@@ -81,14 +81,14 @@ TEST(OverviewText, OnAWideScreenTheListsStandBesideTheRest) {
  Operator    Sample Net 262-42 · home network                                                        Neighbours  PCI 285  RSRP  -90.00 dBm  excellent  0 s ago  ▆▆▆▆▁▁▁▁
                                                                                                                  PCI 286  RSRP  -97.00 dBm  excellent  0 s ago  ▆▆▆▆▁▁▁▁
  Cell        eNodeB 104475 sector 1 · PCI 184 · TAC 6699                                                         PCI 387  RSRP  -98.50 dBm  good       0 s ago  ▆▆▆▁▁▁▁▁
-             EARFCN 1850 · band 3 · 1870.0 MHz
-                                                                                                     Events      22:15:19  serving cell 286 → 184 after 4 s
- Levels      RSRP  -92.75 dBm  excellent  ▆▆▆▆▁▁▁▁                                                               22:15:18  context up: internet
-             RSRQ   -12.62 dB  good       ▆▆▆▁▁▁▁▁                                                               22:15:14  serving cell 82 → 286 after 17 s
-             quality by the profile android                                                                      22:15:01  context down: internet
-                                                                                                                 22:14:57  serving cell 285 → 82 after 13 s
- Contexts    ims Active · internet Active                                                                        22:14:44  serving cell 183 → 285 after 69 s
-                                                                                                                 22:14:42  context up: internet
+             EARFCN 1850 · band 3 · 1870.0 MHz · uplink 1775.0 MHz · bandwidth 20 MHz
+             antenna ports 4                                                                         Events      22:15:19  serving cell 286 → 184 after 4 s
+                                                                                                                 22:15:18  context up: internet
+ Levels      RSRP  -92.75 dBm  excellent  ▆▆▆▆▁▁▁▁                                                               22:15:14  serving cell 82 → 286 after 17 s
+             RSRQ   -12.62 dB  good       ▆▆▆▁▁▁▁▁                                                               22:15:01  context down: internet
+             quality by the profile android                                                                      22:14:57  serving cell 285 → 82 after 13 s
+                                                                                                                 22:14:44  serving cell 183 → 285 after 69 s
+ Contexts    ims Active · internet Active                                                                        22:14:42  context up: internet
                                                                                                                  22:14:27  context down: internet
                                                                                                                  22:14:09  context up: internet
                                                                                                                  22:13:53  context down: internet
@@ -145,7 +145,8 @@ TEST(OverviewText, WithAsciiMarksIsAscii) {
  ------------------------------------------------------------------------------
  Operator    Sample Net 262-42, home network
  Cell        eNodeB 104475 sector 1, PCI 184, TAC 6699
-             EARFCN 1850, band 3, 1870.0 MHz
+             EARFCN 1850, band 3, 1870.0 MHz, uplink 1775.0 MHz
+             bandwidth 20 MHz, antenna ports 4
  Levels      RSRP  -92.75 dBm  excellent  ####....
              RSRQ   -12.62 dB  good       ###.....
              quality by the profile android
@@ -162,7 +163,6 @@ TEST(OverviewText, WithAsciiMarksIsAscii) {
              22:14:42  context up: internet
              22:14:27  context down: internet
              22:14:09  context up: internet
-             22:13:53  context down: internet
  ------------------------------------------------------------------------------
  Updated 2023-11-14 at 22:13:20                                 o panes  ? help
 )");
@@ -176,7 +176,7 @@ TEST(OverviewText, OfGsmAndUmtsHasACellOfEach) {
  GSM cell    cell 12081 · BSIC 33 · 63 s ago
              ARFCN 42 · band P-GSM 900 · 943.4 MHz · 30 s ago
  UMTS cell   RNC 164 cell 388 · PSC 388
-             UARFCN 10713 · band I · 2142.6 MHz
+             UARFCN 10713 · band I · 2142.6 MHz · uplink 1952.6 MHz
  Levels      UMTS RSCP   -84 dB  excellent  ▆▆▆▁▁▁▁▁
              UMTS Ec/Io   -9 dB  fair       ▆▆▆▆▆▁▁▁
              quality by the profile android
@@ -232,7 +232,7 @@ TEST(OverviewText, OfUtranHasLevelsWithoutAUnit) {
  ──────────────────────────────────────────────────────────────────────────────
  Operator    Sample Net 262-42 · home network
  Cell        RNC 167 cell 43037 · PSC 95 · LAC 6699 · 15 s ago
-             UARFCN 10096 · band 34 · 2019.2 MHz
+             UARFCN 10096 · band 34 · 2019.2 MHz · uplink 2019.2 MHz
  Levels      RSCP  0.371094
  State       RRC Cell PCH
  Neighbours  PSC 61 UARFCN 10096   RSCP  0.394531  0 s ago

@@ -31,6 +31,23 @@ protected:
     std::optional<SampleTimeline> drive;
 };
 
+TEST_F(SearchPageTest, HitsThatAreLeftOutAreTold) {
+    const auto valuesOf = [](std::size_t count) {
+        Dictionary values;
+        for (std::size_t index = 0; index < count; ++index) {
+            values.set("Value " + std::to_string(index), "same");
+        }
+        return Dictionary{{"Section", values}};
+    };
+    stage.tick(valuesOf(TextFinder::kMostHits));
+    stage.type("fsame");
+    EXPECT_TRUE(shows("1000 hits"));
+    EXPECT_FALSE(shows("first 1,000 hits"));
+    stage.tick(valuesOf(TextFinder::kMostHits + 1));
+    EXPECT_TRUE(shows("Find in this frame (first 1,000 hits)")) << stage.screen();
+    EXPECT_TRUE(shows("1000 hits"));
+}
+
 TEST_F(SearchPageTest, RowsAreListedAsTheTextIsTyped) {
     stage.type("f");
     EXPECT_EQ(stage.screen(60, 7), R"(
@@ -231,7 +248,7 @@ TEST_F(SearchPageTest, TheWholeRecordingIsSearched) {
  find: cell dch                                                  Tab this frame
 )");
     stage.type("qq");
-    EXPECT_TRUE(shows("No event, name or text of the recording contains it."));
+    EXPECT_TRUE(shows("No event, name or value of the recording contains it."));
     stage.press(Key::Backspace, 2);
     stage.press(Key::Enter);
     ASSERT_EQ(stage.went.size(), 1U);

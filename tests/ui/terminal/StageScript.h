@@ -82,6 +82,10 @@ private:
             const int x = next() % kMostColumns;
             return _stage.mouse(Key::Click, x, next() % kMostRows);
         }
+        case 0x9F: {
+            const int x = next() % kMostColumns;
+            return _stage.mouse(Key::Drag, x, next() % kMostRows);
+        }
         case 0x93:
             return _stage.mouse(Key::WheelUp, 0, 0);
         case 0x94:

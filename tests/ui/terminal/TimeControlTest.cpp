@@ -1,6 +1,7 @@
 #include "tests/timeline/TimelineFixture.h"
 #include "tests/ui/terminal/GridSupport.h"
 #include "tests/ui/terminal/TerminalStage.h"
+#include "ui/terminal/SplitScreen.h"
 
 #include <gtest/gtest.h>
 
@@ -314,6 +315,58 @@ TEST_F(TimeControlTest, AClickOnTheBarGoesThere) {
     EXPECT_EQ(travel.moment().instant, timeline->packets());
     stage.click(11, 23);
     EXPECT_NEAR(travel.shareOf(travel.moment().instant), 0.5, 0.05);
+}
+
+TEST_F(TimeControlTest, DraggingOnTheBarMovesTheHeldInstantUntilTheButtonIsReleased) {
+    stage.type(" ");
+    stage.click(11, 23);
+    stage.mouse(Key::Drag, 6, 23);
+    EXPECT_NEAR(travel.shareOf(travel.moment().instant), 4.0 / 19.0, 0.01);
+    EXPECT_TRUE(shows("22:13:45")) << stage.screen();
+    stage.mouse(Key::Drag, 0, 5); // beyond the bar, in another row
+    EXPECT_EQ(travel.moment().instant, 0U);
+    stage.mouse(Key::Drag, 79, 0);
+    EXPECT_EQ(travel.moment().instant, timeline->packets());
+    stage.mouse(Key::Drag, 11, 23);
+    const std::uint64_t reached = travel.moment().instant;
+    stage.mouse(Key::Release, 11, 23);
+    stage.mouse(Key::Drag, 2, 23);
+    EXPECT_EQ(travel.moment().instant, reached);
+}
+
+TEST_F(TimeControlTest, DraggingOnTheBarOfTheSecondModemMovesItsInstant) {
+    stage.type(" ");
+    TerminalStage other;
+    SplitScreen split({{"car1", other.frontEnd}, {"car2", stage.frontEnd}}, kUtf8Marks, [] {});
+    split.resize(160, 25);
+    (void)split.draw();
+    constexpr int kLeft = 80; // of the second side
+    split.handle({.key = Key::Click, .x = kLeft + 11, .y = 24});
+    (void)split.draw();
+    split.handle({.key = Key::Drag, .x = kLeft + 79, .y = 3});
+    EXPECT_EQ(travel.moment().instant, timeline->packets());
+    split.handle({.key = Key::Drag, .x = 5, .y = 24}); // over the first side
+    EXPECT_EQ(travel.moment().instant, 0U);
+}
+
+TEST_F(TimeControlTest, DraggingThatDidNotBeginOnTheBarDoesNothing) {
+    stage.type(" ");
+    stage.type("y");
+    const std::uint64_t held = travel.moment().instant;
+    stage.mouse(Key::Release, 5, 5);
+    stage.click(5, 15);
+    stage.mouse(Key::Drag, 6, 23);
+    EXPECT_EQ(travel.moment().instant, held);
+    stage.click(11, 23);
+    stage.type("$"); // a key ends it
+    stage.mouse(Key::Drag, 6, 23);
+    EXPECT_FALSE(travel.isAway());
+}
+
+TEST_F(TimeControlTest, ReleasingTheButtonLeavesAMessage) {
+    stage.type("m");
+    stage.mouse(Key::Release, 5, 5);
+    EXPECT_TRUE(shows("d shows what differs.")) << stage.screen();
 }
 
 TEST_F(TimeControlTest, WithoutATimelineTheKeysSaySo) {

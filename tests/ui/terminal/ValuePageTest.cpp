@@ -41,9 +41,15 @@ TEST_F(ValuePageTest, EnterOnALeafOpensItAndSomeKeysCloseIt) {
 
 TEST_F(ValuePageTest, ABranchHasNoPage) {
     show(last());
-    stage.type("iv");
-    EXPECT_EQ(stage.depth(), 1U);
-    EXPECT_FALSE(shows("copy"));
+    for (const char* key : {"i", "v"}) {
+        stage.type(key);
+        EXPECT_EQ(stage.depth(), 1U);
+        EXPECT_FALSE(shows("copy"));
+        EXPECT_TRUE(shows("Nothing to show here: choose a value."));
+        stage.press(Key::Down);
+    }
+    stage.type("t");
+    EXPECT_TRUE(shows("Nothing to show as a table: choose a list."));
 }
 
 TEST_F(ValuePageTest, ZoomsTheCurve) {
@@ -215,6 +221,19 @@ TEST_F(ValuePageTest, SaysWhenNothingWasReadInTheTime) {
     EXPECT_TRUE(shows("no value in the last minute")) << stage.screen();
     stage.type("-");
     EXPECT_FALSE(shows("no value in"));
+}
+
+TEST_F(ValuePageTest, OnlyMeasuresHaveAMean) {
+    show(last());
+    select("Serving Cell Measurements", "Physical Cell ID");
+    stage.type("i");
+    EXPECT_TRUE(shows("min ")) << stage.screen();
+    EXPECT_TRUE(shows("max "));
+    EXPECT_FALSE(shows("mean"));
+    stage.type("i");
+    stage.press(Key::Backspace);
+    openRsrp();
+    EXPECT_TRUE(shows("mean"));
 }
 
 TEST_F(ValuePageTest, HelpAndQuittingWorkAsInAPane) {

@@ -229,11 +229,11 @@ TEST_F(RowCurvesTest, TheOverviewHasThemBesideTheLevels) {
  Pallax › Overview
  ──────────────────────────────────────────────────────────────────────────────
  Cell        eNodeB 104467 sector 1 · PCI 185 · TAC 6700
-             EARFCN 1850 · band 3 · 1870.0 MHz · 61 s ago
+             EARFCN 1850 · band 3 · 1870.0 MHz · uplink 1775.0 MHz
+             bandwidth 20 MHz · antenna ports 2 · 61 s ago
  Levels      RSRP  -86.25 dBm  excellent  ▆▆▆▆▁▁▁▁  ⠲⠒⠒⠒⠤⣤⢄⣀⣤⠶⠤⢤⠤⠒⣦⡤⢤⡤⠴⠶⠒⠉⠳⠴
              RSRQ    -7.00 dB  excellent  ▆▆▆▆▆▆▁▁  ⠛⠓⠚⠋⠒⠾⠢⠤⣾⠛⠉⠓⠗⠉⠷⠖⢲⡖⠒⡟⠊⠉⠻⠚
              quality by the profile
-
  ──────────────────────────────────────────────────────────────────────────────
  Updated 2023-11-14 at 22:13:20                                 o panes  ? help
 )");
