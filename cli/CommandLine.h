@@ -44,6 +44,7 @@ private:
     StatusOptions _status;
     DiffOptions _diff;
     WatchOptions _watch;
+    MaskOptions _mask;
     SnapshotOptions _snapshot;
     RecordOptions _record;
     ServiceRequest _service;

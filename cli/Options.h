@@ -10,6 +10,7 @@
 #include "explaining/ExplainCommand.h"
 #include "inspecting/DiffCommand.h"
 #include "inspecting/StatusCommand.h"
+#include "masking/MaskCommand.h"
 #include "querying/SqlCommand.h"
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
@@ -38,7 +39,8 @@ struct ServiceStatusOptions {};
 using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions, InfoOptions,
-                 SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions, ParseEnd>;
+                 SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions, MaskOptions,
+                 ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -1,0 +1,74 @@
+#include "masking/SnapshotMask.h"
+
+#include "masking/ListMask.h"
+
+#include <algorithm>
+#include <string_view>
+
+namespace pallax {
+
+namespace {
+
+/// The keys that lead into an entry of a snapshot: "Data", an element, and a key of it.
+constexpr std::size_t kEntryDepth = 3;
+
+class SnapshotRule {
+public:
+    explicit SnapshotRule(const std::vector<MaskPlan>& plans) : _plans(plans) {}
+
+    MaskAction of(const ScalarPath& path, const PropertyList& value) const {
+        const bool isInEntry = path.size() >= kEntryDepth && path[0] == "Data";
+        const std::string_view part = isInEntry ? path[kEntryDepth - 1] : std::string_view();
+        MaskAction action = MaskAction::Keep;
+        if (part == "Display" || part == "DisplayState") {
+            const ScalarPath shown(path.begin() + kEntryDepth, path.end());
+            for (const MaskPlan& plan : _plans) {
+                action = std::max(action, plan.ofDisplay(shown));
+            }
+        }
+        return action == MaskAction::Keep ? ofLooseValue(path, value) : action;
+    }
+
+private:
+    const std::vector<MaskPlan>& _plans;
+};
+
+/// Raw bytes get no pseudonym, which would stand for nothing.
+bool isRaw(const ScalarPath& path) {
+    return path.size() == kEntryDepth && path.front() == "Data" &&
+           (path.back() == "DisplayState" || path.back() == "DLF");
+}
+
+} // namespace
+
+bool maskSnapshot(ByteBuffer& content, const std::vector<MaskPlan>& plans,
+                  const Replacements& replacements, MaskReport& report) {
+    const SnapshotRule snapshotRule(plans);
+    std::uint64_t values = 0;
+    ByteBuffer masked = content;
+    // First the raw bytes, with zeros.
+    const ScalarRule raw = [&](const ScalarPath& path, const PropertyList& value) {
+        const bool isMasked = isRaw(path) && value.data() != nullptr;
+        values += isMasked ? 1 : 0;
+        return isMasked ? MaskAction::Mask : MaskAction::Keep;
+    };
+    const Replacement zeros;
+    if (maskList(masked, raw, zeros, replacements.places) == ListMaskResult::NotUnderstood) {
+        return false;
+    }
+    const ScalarRule rest = [&](const ScalarPath& path, const PropertyList& value) {
+        const bool isDone = isRaw(path) && value.data() != nullptr;
+        const MaskAction action = isDone ? MaskAction::Keep : snapshotRule.of(path, value);
+        values += action != MaskAction::Keep ? 1 : 0;
+        return action;
+    };
+    if (maskList(masked, rest, replacements.identities, replacements.places) ==
+        ListMaskResult::NotUnderstood) {
+        return false;
+    }
+    content = std::move(masked);
+    report.values += values;
+    return true;
+}
+
+} // namespace pallax

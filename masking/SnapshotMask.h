@@ -1,0 +1,19 @@
+#pragma once
+
+#include "masking/MaskPlan.h"
+#include "masking/MaskReport.h"
+#include "masking/PacketMask.h"
+#include "text/Bytes.h"
+
+#include <vector>
+
+namespace pallax {
+
+/// Masks a saved snapshot (host/Snapshot.h), which does not tell its technology: a value is masked
+/// if any of the plans, one for each technology, says so. "DisplayState" and "DLF" are raw bytes
+/// without the boundaries of packets, and become zeros whole; what an object stream keeps there is
+/// masked like a message. False, with `content` unchanged, if it cannot be understood.
+bool maskSnapshot(ByteBuffer& content, const std::vector<MaskPlan>& plans,
+                  const Replacements& replacements, MaskReport& report);
+
+} // namespace pallax
