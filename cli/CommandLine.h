@@ -45,6 +45,7 @@ private:
     DiffOptions _diff;
     WatchOptions _watch;
     MaskOptions _mask;
+    VerifyOptions _verify;
     SnapshotOptions _snapshot;
     RecordOptions _record;
     ServiceRequest _service;

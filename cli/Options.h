@@ -15,6 +15,7 @@
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
 #include "telephony/Service.h"
+#include "verifying/VerifyCommand.h"
 #include "watching/WatchCommand.h"
 
 #include <string>
@@ -40,7 +41,7 @@ using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions, InfoOptions,
                  SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions, MaskOptions,
-                 ParseEnd>;
+                 VerifyOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -1,6 +1,7 @@
 #include "cli/SharingOptions.h"
 
 #include "masking/MaskCommand.h"
+#include "verifying/VerifyCommand.h"
 
 #include <CLI/CLI.hpp>
 
@@ -49,7 +50,40 @@ Exit status:
   1   failure; with --check, something was found, or a file cannot be read
   2   wrong usage)";
 
+constexpr const char* kVerifyFooter = R"(Examples:
+  pallax verify --update drive.pcapng
+  pallax verify drive.pcapng
+  pallax verify --expect as-it-should-be.pallax-verify drive.pcapng
+
+--update writes what a recording is to RECORDING.pallax-verify: the number of
+its packets, a digest of each block of 1024 packets with their times, and a
+digest of each field's values in each minute. Later, verify tells which packets
+have changed, and which fields decode otherwise in which minutes, such as after
+an update. --expect reads, or with --update writes, another file: a recording
+with such a file says what is expected of a decoder.
+
+The digests (SHA-256) show damage and drift. They do not show forgery: who
+changes a recording can write them anew. Damage to what is not a packet, such as
+a comment, is not shown.
+
+Exit status:
+  0   every recording is what it was; with --update, the digests are written
+  1   one is not: it is cut or damaged, has changed, or decodes otherwise
+  2   wrong usage
+  3   could not tell: no digests, or a file cannot be read or written)";
+
 } // namespace
+
+void addVerify(CLI::App& app, VerifyOptions& options) {
+    app.add_flag("--update", options.update, "Write the digests instead");
+    app.add_option("--expect", options.expect,
+                   "The file of digests (default: RECORDING.pallax-verify)")
+        ->type_name("FILE");
+    app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
+        ->required()
+        ->type_name("");
+    app.footer(kVerifyFooter);
+}
 
 void addMask(CLI::App& app, MaskOptions& options) {
     CLI::Option* output = app.add_option("-o,--output", options.output,

@@ -35,7 +35,7 @@ TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
                   "pallax", "pallax-decode", "pallax-record", "pallax-service", "pallax-demo",
                   "pallax-simulate", "pallax-events", "pallax-fields", "pallax-explain",
                   "pallax-info", "pallax-snapshot", "pallax-sql", "pallax-status", "pallax-diff",
-                  "pallax-watch", "pallax-mask"}));
+                  "pallax-watch", "pallax-mask", "pallax-verify"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 
