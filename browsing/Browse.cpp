@@ -56,7 +56,8 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
         PrintBrowser browser(
             std::move(directory), request.onFatalRecord, child, request.settings.afterReconnect,
             output, sourceName(request.options.source),
-            request.options.plain ? TreePrinter::Form::Sentences : TreePrinter::Form::Tree);
+            request.options.plain ? TreePrinter::Form::Sentences : TreePrinter::Form::Tree,
+            request.options.safe);
         isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // the printed text and the generators' notices
@@ -85,7 +86,8 @@ bool browseOnScreen(const Request& request, SocketDirectory directory, ChildServ
     }
     const GuardedTerminal guard;
     ScreenBrowser browser(std::move(directory), request.onFatalRecord, child,
-                          request.options.source, request.settings, **terminal, notices);
+                          request.options.source, request.settings, **terminal, notices,
+                          request.options.safe);
     return browser.run();
 }
 

@@ -15,6 +15,7 @@ struct BrowseOptions {
     bool plain = false; ///< prints sentences instead of trees
     terminal::ColorUse color = terminal::ColorUse::Auto;
     bool mouse = true;
+    bool safe = false; ///< shows nothing that identifies a person
     bool keepGoing = false;
     std::optional<int> logLevel; ///< system-log lines up to it go to standard error
 };

@@ -21,12 +21,16 @@ void PrintBrowser::Notices::printLine(std::string_view line) {
 
 PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
                            ChildService* child, AfterReconnect afterReconnect, Output& output,
-                           std::string source, TreePrinter::Form form)
+                           std::string source, TreePrinter::Form form, bool isSafe)
     : _source(std::move(source)), _afterReconnect(afterReconnect), _notices(output),
-      _link(std::move(directory), onFatalRecord, child, _notices),
+      _link(std::move(directory), onFatalRecord, child, _notices), _safe(_link.resources()),
       _printer(
           output, _link.clock(), [this] { return _model->topLevelNodes(); }, form),
-      _model(makeModel()) {}
+      _model(makeModel()) {
+    if (isSafe) {
+        _link.setFilter([this](Bytes packet) { return _safe.masked(packet); });
+    }
+}
 
 PrintBrowser::~PrintBrowser() {
     FilePreferences preferences(FilePreferences::userFolder());
@@ -66,7 +70,8 @@ void PrintBrowser::updateViewControllerFromModel() {
     _printer.updateViewControllerFromModel();
 }
 
-void PrintBrowser::generatorChosen(const std::string& /*technology*/, bool keepsDisplay) {
+void PrintBrowser::generatorChosen(const std::string& technology, bool keepsDisplay) {
+    _safe.begin(technology);
     _displayAge.generatorChosen(keepsDisplay, _link.clock().now());
     if (!keepsDisplay) {
         return;

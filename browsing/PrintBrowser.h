@@ -1,5 +1,6 @@
 #pragma once
 
+#include "browsing/SafePackets.h"
 #include "browsing/TreePrinter.h"
 #include "link/BrowseLink.h"
 #include "link/Settings.h"
@@ -20,7 +21,7 @@ public:
     /// `source` names the source in messages.
     PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
                  AfterReconnect afterReconnect, Output& output, std::string source,
-                 TreePrinter::Form form);
+                 TreePrinter::Form form, bool isSafe);
     /// Switches the home-screen preference off, as the application does, however browsing ended.
     ~PrintBrowser() override;
     PrintBrowser(const PrintBrowser&) = delete;
@@ -53,6 +54,7 @@ private:
     bool _childLost = false;
     Notices _notices;
     BrowseLink _link;
+    SafePackets _safe;
     TreePrinter _printer;
     std::unique_ptr<PallaxModel> _model;
 };

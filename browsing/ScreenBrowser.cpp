@@ -36,23 +36,25 @@ terminal::Marks marksWith(terminal::Marks marks, CurveCharacters curves) {
 
 ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
                              ChildService* child, const Source& source, const Settings& settings,
-                             terminal::CursesTerminal& terminal, StandardOutput& notices)
+                             terminal::CursesTerminal& terminal, StandardOutput& notices,
+                             bool isSafe)
     : _terminal(terminal), _link(std::move(directory), onFatalRecord, child, notices),
-      _keys(_link.queue(), terminal.inputDescriptor()), _watch(_link.resources()),
-      _timeline({.link = _link,
-                 .source = source,
-                 .journal = settings.journal,
-                 .indexed =
-                     [this] {
-                         if (_travel.isAway()) { // the bar grows
-                             needsDisplay();
-                         }
-                     },
-                 .replaced =
-                     [this] {
-                         _travel.reset();
-                         _frontEnd.forgetTimeline();
-                     }}),
+      _safe(_link.resources()), _keys(_link.queue(), terminal.inputDescriptor()),
+      _watch(_link.resources()), _timeline({.link = _link,
+                                            .source = source,
+                                            .journal = settings.journal,
+                                            .onlyWhatHasCome = isSafe,
+                                            .indexed =
+                                                [this] {
+                                                    if (_travel.isAway()) { // the bar grows
+                                                        needsDisplay();
+                                                    }
+                                                },
+                                            .replaced =
+                                                [this] {
+                                                    _travel.reset();
+                                                    _frontEnd.forgetTimeline();
+                                                }}),
       _travel(travelSurroundings()),
       _alarms({settings.alarms, knowledge(),
                [this](const auto& text) {
@@ -61,6 +63,9 @@ ScreenBrowser::ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRec
       _marks(marksWith(terminal.marks(), settings.curves)),
       _frontEnd(frontEndSurroundings(), _marks), _preferences(FilePreferences::userFolder()),
       _session(sessionSurroundings(source, settings)) {
+    if (isSafe) {
+        _link.setFilter([this](Bytes packet) { return _safe.masked(packet); });
+    }
     _frontEnd.showListsAsTables(settings.lists == Lists::Table);
     if (settings.firstScreen == FirstScreen::Overview) {
         _frontEnd.openOverview();
@@ -183,6 +188,7 @@ EntryPart ScreenBrowser::entryPart(const std::string& path) const {
 
 void ScreenBrowser::begin(const std::string& technology) {
     _alarms.begin(nullptr); // the values end
+    _safe.begin(technology);
     _watch.begin(technology);
     _timeline.begin(technology);
     _alarms.begin(_watch.values());

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "app/BrowsingSession.h"
+#include "browsing/SafePackets.h"
 #include "browsing/ViewedTimeline.h"
 #include "host/FilePreferences.h"
 #include "host/HostFileSystem.h"
@@ -29,7 +30,7 @@ public:
     /// terminal is restored.
     ScreenBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
                   const Source& source, const Settings& settings,
-                  terminal::CursesTerminal& terminal, StandardOutput& notices);
+                  terminal::CursesTerminal& terminal, StandardOutput& notices, bool isSafe);
     ScreenBrowser(const ScreenBrowser&) = delete;
     ScreenBrowser& operator=(const ScreenBrowser&) = delete;
 
@@ -60,6 +61,7 @@ private:
     bool _isDisplayPosted = false;
     terminal::CursesTerminal& _terminal;
     BrowseLink _link;
+    SafePackets _safe;
     DescriptorWatch _keys;
     StatusWatch _watch;
     ViewedTimeline _timeline;

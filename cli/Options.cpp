@@ -200,6 +200,8 @@ void addView(CLI::App& app, BrowseOptions& options) {
     app.add_flag_callback(
         "--no-mouse", [&options] { options.mouse = false; },
         "Leave the mouse to the terminal, to select text");
+    app.add_flag("--safe", options.safe,
+                 "Show zeros in place of what identifies a person, whatever key is pressed");
     app.add_flag("--keep-going", options.keepGoing,
                  "Drop a record that cannot be read instead of exiting with status 70");
     addLogLevel(app, options.logLevel);

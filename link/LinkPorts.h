@@ -27,12 +27,18 @@ public:
         std::function<bool()> isServiceThere;
     };
 
+    /// What is delivered in place of a packet.
+    using PacketFilter = std::function<ByteBuffer(Bytes packet)>;
+
     /// The references in the setup must outlive the ports.
     explicit LinkPorts(Setup setup) : _setup(std::move(setup)) {}
 
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override;
     std::unique_ptr<HXServerConnection> connect(std::function<void()> notification) override;
+
+    /// Applies to all packets that follow.
+    void setFilter(PacketFilter filter) { _filter = std::move(filter); }
 
     /// The last problem of the latest start ("No telephony service is running"), for a link that is
     /// not connected; empty before the first start.
@@ -46,6 +52,7 @@ private:
     class Connection;
 
     Setup _setup;
+    PacketFilter _filter;   // may be empty
     std::string _localName; ///< in place of the model's
     std::string _obstacle;
     std::uint64_t _received = 0;

@@ -23,7 +23,7 @@ class Resources;
 struct MaskOptions {
     std::vector<std::string> files = {};
     std::string output = {}; ///< a file or, for several files, a folder
-    bool check = false; ///< look for identities instead
+    bool check = false;      ///< look for identities instead
     MaskChoice choice = {};
     std::string keyFile = {}; ///< for pseudonyms; empty: zeros
 };

@@ -5,6 +5,7 @@
 #include "masking/PacketMask.h"
 #include "text/Bytes.h"
 
+#include <string_view>
 #include <vector>
 
 namespace pallax {
@@ -15,5 +16,9 @@ namespace pallax {
 /// masked like a message. False, with `content` unchanged, if it cannot be understood.
 bool maskSnapshot(ByteBuffer& content, const std::vector<MaskPlan>& plans,
                   const Replacements& replacements, MaskReport& report);
+
+/// Masks a list that holds one display of a snapshot under a key.
+bool maskSnapshotDisplay(ByteBuffer& list, std::string_view key, const std::vector<MaskPlan>& plans,
+                         const Replacements& replacements);
 
 } // namespace pallax
