@@ -12,7 +12,8 @@
 
 namespace pallax {
 
-RecordingError recordingError(Kind kind, const std::string& name, std::string_view what) {
+RecordingError recordingError(RecordingError::Kind kind, const std::string& name,
+                              std::string_view what) {
     return {kind, formatText("%@ %@.", {name, what})};
 }
 

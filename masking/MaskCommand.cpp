@@ -90,7 +90,7 @@ std::optional<std::string> MaskCommand::outputOf(const std::string& file,
 
 std::optional<std::string> MaskCommand::mask(const std::string& file) {
     std::string output;
-    if (const auto refusal = outputOf(file, output)) {
+    if (auto refusal = outputOf(file, output)) {
         return refusal;
     }
     const std::string name = file == "-" ? "standard input" : file;

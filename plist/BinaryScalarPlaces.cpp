@@ -128,7 +128,7 @@ private:
         if (object.kind == kSingleton) {
             return {};
         }
-        const PropertyList value = valueOf(object);
+        PropertyList value = valueOf(object);
         const bool isText = object.kind == kAscii || object.kind == kUtf8;
         const Coding coding = isText                  ? Coding::Letters
                               : object.kind == kUtf16 ? Coding::Utf16

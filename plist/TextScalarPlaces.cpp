@@ -103,7 +103,7 @@ private:
         const auto parsed = parseTextPropertyList(
             Bytes(reinterpret_cast<const std::uint8_t*>(_text.data()) + start, // NOLINT
                   _at - start));
-        const PropertyList value = parsed ? *parsed : PropertyList();
+        PropertyList value = parsed ? *parsed : PropertyList();
         const Coding coding = isData ? Coding::Hex : Coding::Letters;
         _visitor({_path, {value.type(), coding, content, isKey}, value});
         return value;

@@ -49,6 +49,12 @@ TEST_F(EndToEndSafe, NoKeyShowsFindsOrSavesAnIdentity) {
     ASSERT_TRUE(terminal.shows("Save snapshot"));
     terminal.type("\r\r");
     ASSERT_TRUE(terminal.shows("Saved " + snapshots));
+    terminal.type("j"); // removes the message
+    ASSERT_TRUE(terminal.showsNoMore("Saved "));
+    terminal.type("h");
+    ASSERT_TRUE(terminal.showsNoMore("Pallax › "));
+    terminal.type(kEscape); // removes the filter
+    ASSERT_TRUE(terminal.shows("PDP Context Info"));
     terminal.type("q");
     EXPECT_EQ(terminal.wait(), 0);
     const auto saved = filesIn(snapshots);
