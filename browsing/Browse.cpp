@@ -58,7 +58,8 @@ bool browseInPrint(const Request& request, SocketDirectory directory, ChildServi
         PrintBrowser browser(std::move(directory), request.onFatalRecord, child, request.settings,
                              output, sourceName(request.options.source),
                              request.options.plain ? TreePrinter::Form::Sentences
-                                                   : TreePrinter::Form::Tree);
+                                                   : TreePrinter::Form::Tree,
+                             request.options.safe);
         isWhole = browser.run();
     } catch (const FatalRecord&) {
         output.flush(); // the printed text and the generators' notices
@@ -95,9 +96,9 @@ bool browseOnScreen(const Request& request, SocketDirectory directory, ChildServ
         throw std::runtime_error(terminal.error().sentence);
     }
     const GuardedTerminal guard;
-    ScreenBrowser browser(
-        {request.settings, request.profile, request.onFatalRecord, **terminal, notices},
-        std::move(shown));
+    ScreenBrowser browser({request.settings, request.profile, request.onFatalRecord,
+                           request.options.safe, **terminal, notices},
+                          std::move(shown));
     return browser.run();
 }
 

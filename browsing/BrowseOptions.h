@@ -22,6 +22,7 @@ struct BrowseOptions {
     terminal::ColorUse color = terminal::ColorUse::Auto;
     bool mouse = true;
     std::optional<std::string> profile; ///< that judges levels; nothing: that of the settings
+    bool safe = false;                  ///< shows nothing that identifies a person
     bool keepGoing = false;
     std::optional<int> logLevel; ///< system-log lines up to it go to standard error
 };

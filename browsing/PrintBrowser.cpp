@@ -23,14 +23,18 @@ void PrintBrowser::Notices::printLine(std::string_view line) {
 
 PrintBrowser::PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord,
                            ChildService* child, const Settings& settings, Output& output,
-                           std::string source, TreePrinter::Form form)
+                           std::string source, TreePrinter::Form form, bool isSafe)
     : _source(std::move(source)), _afterReconnect(settings.afterReconnect), _notices(output),
-      _link(_queue, std::move(directory), onFatalRecord, child, _notices),
+      _link(_queue, std::move(directory), onFatalRecord, child, _notices), _safe(_link.resources()),
       _alarms({settings.alarms, installedKnowledge(),
                [](const std::string& text) { complain("Alarms that are left out: " + text); }}),
       _printer(
           output, _link.clock(), [this] { return _model->topLevelNodes(); }, form),
-      _model(makeModel()) {}
+      _model(makeModel()) {
+    if (isSafe) {
+        _link.setFilter([this](Bytes packet) { return _safe.masked(packet); });
+    }
+}
 
 PrintBrowser::~PrintBrowser() {
     FilePreferences preferences(FilePreferences::userFolder());
@@ -81,6 +85,7 @@ void PrintBrowser::checkAlarms(const std::string& technology) {
 
 void PrintBrowser::generatorChosen(const std::string& technology, bool keepsDisplay) {
     checkAlarms(technology);
+    _safe.begin(technology);
     _displayAge.generatorChosen(keepsDisplay, _link.clock().now());
     if (!keepsDisplay) {
         return;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "browsing/SafePackets.h"
 #include "browsing/TreePrinter.h"
 #include "link/BrowseLink.h"
 #include "link/Settings.h"
@@ -21,7 +22,7 @@ public:
     /// `source` names the source in messages. The settings must outlive the browser.
     PrintBrowser(SocketDirectory directory, OnFatalRecord onFatalRecord, ChildService* child,
                  const Settings& settings, Output& output, std::string source,
-                 TreePrinter::Form form);
+                 TreePrinter::Form form, bool isSafe);
     /// Switches the home-screen preference off, as the application does, however browsing ended.
     ~PrintBrowser() override;
     PrintBrowser(const PrintBrowser&) = delete;
@@ -56,6 +57,7 @@ private:
     Notices _notices;
     AsioMainQueue _queue;
     BrowseLink _link;
+    SafePackets _safe;
     AlarmWatch _alarms; ///< of which only the mistakes are told
     TreePrinter _printer;
     std::unique_ptr<PallaxModel> _model;

@@ -38,6 +38,7 @@ ScreenSession::Screen ScreenBrowser::screen(const Setup& setup) {
             .settings = setup.settings,
             .profile = setup.profile,
             .onFatalRecord = setup.onFatalRecord,
+            .isSafe = setup.isSafe,
             .needsDisplay = [this] { needsDisplay(); },
             .repaint =
                 [this] {

@@ -20,6 +20,7 @@ public:
         const Settings& settings;
         const QualityProfile& profile; ///< judges levels
         OnFatalRecord onFatalRecord;
+        bool isSafe;
         terminal::CursesTerminal& terminal;
         StandardOutput& notices;
     };

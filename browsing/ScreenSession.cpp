@@ -18,20 +18,22 @@ ScreenSession::ScreenSession(const Screen& screen, Shown shown)
     : _screen(screen), _name(sourceName(shown.source)),
       _link(screen.queue, std::move(shown.directory), screen.onFatalRecord, shown.child,
             screen.notices),
-      _watch(_link.resources()), _timeline({.link = _link,
-                                            .source = shown.source,
-                                            .journal = screen.settings.journal,
-                                            .indexed =
-                                                [this] {
-                                                    if (_travel.isAway()) { // the bar grows
-                                                        _screen.needsDisplay();
-                                                    }
-                                                },
-                                            .replaced =
-                                                [this] {
-                                                    _travel.reset();
-                                                    _frontEnd.forgetTimeline();
-                                                }}),
+      _safe(_link.resources()), _watch(_link.resources()),
+      _timeline({.link = _link,
+                 .source = shown.source,
+                 .journal = screen.settings.journal,
+                 .onlyWhatHasCome = screen.isSafe,
+                 .indexed =
+                     [this] {
+                         if (_travel.isAway()) { // the bar grows
+                             _screen.needsDisplay();
+                         }
+                     },
+                 .replaced =
+                     [this] {
+                         _travel.reset();
+                         _frontEnd.forgetTimeline();
+                     }}),
       _travel(travelSurroundings()),
       _alarms({screen.settings.alarms, knowledge(),
                [this](const auto& text) {
@@ -39,6 +41,9 @@ ScreenSession::ScreenSession(const Screen& screen, Shown shown)
                }}),
       _frontEnd(frontEndSurroundings(), screen.marks), _preferences(FilePreferences::userFolder()),
       _session(sessionSurroundings(isReadOnce(shown.source))) {
+    if (screen.isSafe) {
+        _link.setFilter([this](Bytes packet) { return _safe.masked(packet); });
+    }
     _frontEnd.showListsAsTables(screen.settings.lists == Lists::Table);
     if (screen.settings.firstScreen == FirstScreen::Overview) {
         _frontEnd.openOverview();
@@ -151,6 +156,7 @@ EntryPart ScreenSession::entryPart(const std::string& path) const {
 
 void ScreenSession::begin(const std::string& technology) {
     _alarms.begin(nullptr); // the values end
+    _safe.begin(technology);
     _watch.begin(technology);
     _timeline.begin(technology);
     _alarms.begin(_watch.values());

@@ -2,6 +2,7 @@
 
 #include "app/BrowsingSession.h"
 #include "browsing/LinkNotes.h"
+#include "browsing/SafePackets.h"
 #include "browsing/ViewedTimeline.h"
 #include "host/FilePreferences.h"
 #include "host/HostFileSystem.h"
@@ -36,6 +37,7 @@ public:
         const Settings& settings;
         const QualityProfile& profile; ///< judges levels
         OnFatalRecord onFatalRecord;
+        bool isSafe;                        ///< nothing that identifies a person is shown
         std::function<void()> needsDisplay; ///< requests a drawing soon
         std::function<void()> repaint;
         std::function<void(const std::string& text)> copy; ///< to the clipboard
@@ -82,6 +84,7 @@ private:
     const Screen& _screen;
     const std::string _name;
     BrowseLink _link;
+    SafePackets _safe;
     StatusWatch _watch;
     ViewedTimeline _timeline;
     Travel _travel;

@@ -28,7 +28,7 @@ std::unique_ptr<RecordingJournal> journalOf(const Source& source) {
 } // namespace
 
 ViewedTimeline::ViewedTimeline(const Setup& setup)
-    : _link(setup.link), _recording(journalOf(setup.source)),
+    : _link(setup.link), _recording(setup.onlyWhatHasCome ? nullptr : journalOf(setup.source)),
       _slices(setup.link.queue(), [indexed = setup.indexed](Timeline&) { indexed(); }),
       _live({.queue = setup.link.queue(),
              .resources = setup.link.resources(),

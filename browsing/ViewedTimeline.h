@@ -26,6 +26,8 @@ public:
         BrowseLink& link;
         const Source& source;
         BoundedJournal::Limits journal = {};
+        /// Never look into the recording's file, which holds more than may be shown.
+        bool onlyWhatHasCome = false;
         std::function<void()> indexed = [] {};
         /// Called when the timeline is another one.
         std::function<void()> replaced = [] {};

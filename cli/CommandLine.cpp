@@ -5,6 +5,7 @@
 #include "cli/InspectOptions.h"
 #include "cli/ManualPage.h"
 #include "cli/OptionParts.h"
+#include "cli/SharingOptions.h"
 #include "cli/SimulateOptions.h"
 #include "text/Suggestion.h"
 
@@ -105,6 +106,8 @@ CommandLine::CommandLine()
     addStatus(addCommand("status", "Show the radio in a few lines"), _status);
     addDiff(addCommand("diff", "Compare two recordings, or two moments of one"), _diff);
     addWatch(addCommand("watch", "Tell when a condition becomes true"), _watch);
+    addMask(addCommand("mask", "Copy files without what identifies a person"), _mask);
+    addVerify(addCommand("verify", "Tell whether recordings are what they were"), _verify);
     addTexts();
 }
 
@@ -192,6 +195,12 @@ ParsedOptions CommandLine::chosen() const {
             return wrongUsage(refusal, command);
         }
     }
+    if (_app->got_subcommand("mask") && _mask.output.empty() && !_mask.check) {
+        return wrongUsage("--output or --check is required", "mask");
+    }
+    if (!_verify.expect.empty() && _verify.recordings.size() > 1) {
+        return wrongUsage("--expect is about one recording", "verify");
+    }
     if (!_shell.empty()) {
         return ParseEnd{kExitSuccess, completionScript(description(), _shell)};
     }
@@ -233,6 +242,12 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("status")) {
         return _status;
+    }
+    if (_app->got_subcommand("verify")) {
+        return _verify;
+    }
+    if (_app->got_subcommand("mask")) {
+        return _mask;
     }
     if (_app->got_subcommand("snapshot")) {
         return _snapshot;

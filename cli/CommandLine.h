@@ -44,6 +44,8 @@ private:
     StatusOptions _status;
     DiffOptions _diff;
     WatchOptions _watch;
+    MaskOptions _mask;
+    VerifyOptions _verify;
     SnapshotOptions _snapshot;
     RecordOptions _record;
     ServiceRequest _service;

@@ -236,6 +236,8 @@ void addView(CLI::App& app, BrowseOptions& options) {
     app.add_option("--profile", options.profile,
                    "The profile that judges levels (default: android, or that of pallax.conf)")
         ->type_name("android|field|operator|NAME");
+    app.add_flag("--safe", options.safe,
+                 "Show zeros in place of what identifies a person, whatever key is pressed");
     app.add_flag("--keep-going", options.keepGoing,
                  "Drop a record that cannot be read instead of exiting with status 70");
     addLogLevel(app, options.logLevel);

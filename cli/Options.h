@@ -10,10 +10,12 @@
 #include "explaining/ExplainCommand.h"
 #include "inspecting/DiffCommand.h"
 #include "inspecting/StatusCommand.h"
+#include "masking/MaskCommand.h"
 #include "querying/SqlCommand.h"
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
 #include "telephony/Service.h"
+#include "verifying/VerifyCommand.h"
 #include "watching/WatchCommand.h"
 
 #include <string>
@@ -44,7 +46,7 @@ using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  ServiceListOptions, SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions,
                  InfoOptions, SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
-                 ParseEnd>;
+                 MaskOptions, VerifyOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -46,6 +46,8 @@ struct Run {
     ExitStatus operator()(const StatusOptions& options) const { return runStatus(options); }
     ExitStatus operator()(const DiffOptions& options) const { return runDiff(options); }
     ExitStatus operator()(const WatchOptions& options) const { return runWatch(options); }
+    ExitStatus operator()(const MaskOptions& options) const { return runMask(options); }
+    ExitStatus operator()(const VerifyOptions& options) const { return runVerify(options); }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);

@@ -62,6 +62,7 @@ ListDescription describe(const ListLayout& layout) {
     list.entryName = layout.entryName;
     list.ifEmpty = layout.ifEmpty;
     list.formula = layout.formula;
+    list.varying = layout.varying;
     list.staysWithoutEntries = layout.staysWithoutEntries;
     list.isShown = layout.isShown;
     list.rememberedAs = layout.rememberedAs;

@@ -51,6 +51,7 @@ struct ListDescription {
     std::optional<Position> entryName = std::nullopt;
     std::string_view ifEmpty = {};
     std::string_view formula = {};
+    EntryList::Layout (*varying)(const LogRecord& place) = nullptr;
     bool staysWithoutEntries = false;
     bool isShown = true;
     std::string_view rememberedAs = {};

@@ -101,7 +101,7 @@ ByteBuffer sectionHeader() {
 
 Result<std::unique_ptr<PcapNgWriter>, HostError> PcapNgWriter::create(const std::string& path,
                                                                       Existing existing) {
-    constexpr mode_t kMode = S_IRUSR | S_IWUSR | S_IRGRP | S_IROTH;
+    constexpr mode_t kMode = S_IRUSR | S_IWUSR; // it tells where a person was
     constexpr int kFlags = O_WRONLY | O_CREAT | O_CLOEXEC;
     const bool toOutput = path == "-";
     Descriptor file(toOutput ? -1 : ::open(path.c_str(), kFlags | O_EXCL, kMode));

@@ -21,7 +21,7 @@ namespace pallax {
 /// crash loses at most the last one, and if a packet cannot be written completely (a full disk) the
 /// file is cut back to the previous packet.
 ///
-/// The file is locked while it is written. An existing file keeps its content until the first
+/// A new file can be read by its user alone (0600). The file is locked while it is written. An existing file keeps its content until the first
 /// packet arrives, and a new file that gets none is removed at the end.
 class PcapNgWriter {
 public:

@@ -43,6 +43,8 @@ public:
     const Bundle& bundle() const { return _bundle; }
     ModemLink::Platform platform();
     /// See LinkPorts.
+    void setFilter(LinkPorts::PacketFilter filter) { _linkPorts.setFilter(std::move(filter)); }
+    /// See LinkPorts.
     const std::string& obstacle() const { return _linkPorts.obstacle(); }
 
     /// See LinkPorts.

@@ -12,6 +12,8 @@ namespace pallax {
 
 namespace {
 
+constexpr std::int32_t kPacketMessage = 0;
+
 constexpr const char* kNoAnswer = "The telephony service does not answer";
 constexpr const char* kBusy = "The telephony service is busy with other clients";
 constexpr const char* kNothingToPlay = "The telephony service has nothing to play to this client";
@@ -72,6 +74,10 @@ MessagePorts::Local LinkPorts::createLocal(std::string_view name, ReceiveCallbac
     ReceiveCallback receive = [this, callback = std::move(callback)](std::int32_t identifier,
                                                                      Bytes data) {
         ++_received;
+        if (_filter && identifier == kPacketMessage) {
+            const ByteBuffer filtered = _filter(data);
+            return callback(identifier, filtered);
+        }
         return callback(identifier, data);
     };
     _localName = name;

@@ -28,12 +28,18 @@ public:
         std::string serviceName = {}; ///< empty: the service has none
     };
 
+    /// What is delivered in place of a packet.
+    using PacketFilter = std::function<ByteBuffer(Bytes packet)>;
+
     /// The references in the setup must outlive the ports.
     explicit LinkPorts(Setup setup);
 
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override;
     std::unique_ptr<HXServerConnection> connect(std::function<void()> notification) override;
+
+    /// Applies to all packets that follow.
+    void setFilter(PacketFilter filter) { _filter = std::move(filter); }
 
     /// The last problem of the latest start ("No telephony service is running"), for a link that is
     /// not connected; empty before the first start.
@@ -48,6 +54,7 @@ private:
 
     Setup _setup;
     std::string _noService; ///< an obstacle
+    PacketFilter _filter;   // may be empty
     std::string _localName; ///< in place of the model's
     std::string _obstacle;
     std::uint64_t _received = 0;

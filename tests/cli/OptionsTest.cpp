@@ -264,7 +264,7 @@ TEST(Options, EventsAreOfRecordings) {
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
     for (const char* command :
          {"", "decode", "record", "service", "demo", "simulate", "events", "fields", "explain",
-          "info", "snapshot", "sql", "status", "diff", "watch", "completion", "manual"}) {
+          "info", "snapshot", "sql", "status", "diff", "watch", "mask", "verify", "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);

@@ -17,6 +17,7 @@
 #include <filesystem>
 #include <functional>
 #include <sys/resource.h>
+#include <sys/stat.h>
 #include <unistd.h>
 
 namespace pallax {
@@ -118,6 +119,13 @@ TEST_F(PcapNgWriterTest, AnyPacketsAreReadBack) {
         RC_ASSERT(!(*recording)->next());
         RC_ASSERT(!(*recording)->error());
     }));
+}
+
+TEST_F(PcapNgWriterTest, ANewFileIsItsUsersAlone) {
+    const auto writer = create();
+    struct stat status {};
+    ASSERT_EQ(::stat(path.c_str(), &status), 0);
+    EXPECT_EQ(status.st_mode & 0777U, 0600U);
 }
 
 TEST_F(PcapNgWriterTest, ATimeBefore1970IsWrittenAs1970) {

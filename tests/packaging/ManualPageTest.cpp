@@ -31,11 +31,11 @@ CommandDescription program() {
 
 TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
     EXPECT_EQ(manualPages(program()),
-              (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record",
-                                        "pallax-service", "pallax-demo", "pallax-simulate",
-                                        "pallax-events", "pallax-fields", "pallax-explain",
-                                        "pallax-info", "pallax-snapshot", "pallax-sql",
-                                        "pallax-status", "pallax-diff", "pallax-watch"}));
+              (std::vector<std::string>{
+                  "pallax", "pallax-decode", "pallax-record", "pallax-service", "pallax-demo",
+                  "pallax-simulate", "pallax-events", "pallax-fields", "pallax-explain",
+                  "pallax-info", "pallax-snapshot", "pallax-sql", "pallax-status", "pallax-diff",
+                  "pallax-watch", "pallax-mask", "pallax-verify"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 
@@ -130,6 +130,7 @@ TEST(ManualPage, NoPageMakesTheFormatterComplain) {
     const doubles::TemporaryFolder folder;
     std::vector<std::string> files{PALLAX_SOURCE_DIR "/docs/man/pallax.conf.5",
                                    PALLAX_SOURCE_DIR "/docs/man/pallax-recording.7",
+                                   PALLAX_SOURCE_DIR "/docs/man/pallax-privacy.7",
                                    PALLAX_SOURCE_DIR "/docs/man/pallax-sections.7",
                                    PALLAX_SOURCE_DIR "/docs/man/pallax-sql.7"};
     for (const std::string& name : manualPages(program())) {

@@ -1,0 +1,14 @@
+#pragma once
+
+#include "LogGenerator/Records/LogRecord.h"
+
+#include <cstdint>
+#include <span>
+
+namespace pallax {
+
+/// Writes the number at a position of a record, the inverse of LogRecord::read; bits past the end
+/// are dropped.
+void writeNumber(std::span<std::uint8_t> record, const Position& position, std::uint64_t number);
+
+} // namespace pallax

@@ -1,0 +1,58 @@
+#include "verifying/Sha256.h"
+
+#include <array>
+#include <openssl/evp.h>
+#include <stdexcept>
+
+namespace pallax {
+
+namespace {
+
+void require(bool isDone) {
+    if (!isDone) {
+        throw std::runtime_error("A digest cannot be computed.");
+    }
+}
+
+} // namespace
+
+void Sha256::Free::operator()(evp_md_ctx_st* state) const {
+    EVP_MD_CTX_free(state);
+}
+
+Sha256::Sha256() : _state(EVP_MD_CTX_new()) {
+    require(_state != nullptr);
+    begin();
+}
+
+void Sha256::begin() {
+    require(EVP_DigestInit_ex(_state.get(), EVP_sha256(), nullptr) == 1);
+}
+
+Sha256& Sha256::add(Bytes bytes) {
+    require(EVP_DigestUpdate(_state.get(), bytes.data(), bytes.size()) == 1);
+    return *this;
+}
+
+Sha256& Sha256::add(std::string_view text) {
+    require(EVP_DigestUpdate(_state.get(), text.data(), text.size()) == 1);
+    return *this;
+}
+
+std::string Sha256::finish() {
+    constexpr std::string_view kDigits = "0123456789abcdef";
+    constexpr unsigned kHalfBits = 4;
+    constexpr unsigned kHalf = 0xF;
+    std::array<std::uint8_t, EVP_MAX_MD_SIZE> digest{};
+    unsigned size = 0;
+    require(EVP_DigestFinal_ex(_state.get(), digest.data(), &size) == 1);
+    begin();
+    std::string text;
+    for (const std::uint8_t byte : std::span(digest).first(size)) {
+        text += kDigits[byte >> kHalfBits];
+        text += kDigits[byte & kHalf];
+    }
+    return text;
+}
+
+} // namespace pallax

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "text/Bytes.h"
+
+#include <memory>
+#include <string>
+#include <string_view>
+
+// The state of the library that computes digests.
+struct evp_md_ctx_st;
+
+namespace pallax {
+
+/// A SHA-256 that is being computed.
+class Sha256 {
+public:
+    Sha256();
+    Sha256& add(Bytes bytes);
+    Sha256& add(std::string_view text);
+    /// The digest of what was added, as 64 hexadecimal digits; a new one begins.
+    std::string finish();
+
+private:
+    struct Free {
+        void operator()(evp_md_ctx_st* state) const;
+    };
+
+    void begin();
+
+    std::unique_ptr<evp_md_ctx_st, Free> _state;
+};
+
+} // namespace pallax

@@ -1,0 +1,108 @@
+#include "verifying/VerifyCommand.h"
+
+#include "LogGenerator/Technologies/Technologies.h"
+#include "console/Output.h"
+#include "decoding/DroppedNotices.h"
+#include "decoding/Preconditions.h"
+#include "decoding/RequiredTemplates.h"
+#include "host/BuildBundle.h"
+#include "host/Complaint.h"
+#include "host/DirectoryResources.h"
+#include "host/Files.h"
+#include "host/Snapshot.h"
+#include "text/Format.h"
+#include "verifying/DigestDifference.h"
+#include "verifying/DigestFile.h"
+
+#include <unistd.h>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::size_t kLargestDigestFile = std::size_t{1} << 30U; // bytes
+
+/// What is worse to know of several recordings.
+ExitStatus worse(ExitStatus one, ExitStatus other) {
+    if (one == kExitFailure || other == kExitFailure) {
+        return kExitFailure;
+    }
+    return one == kExitSuccess ? other : one;
+}
+
+} // namespace
+
+ExitStatus VerifyCommand::couldNotTell(const std::string& sentence) {
+    _environment.report(sentence);
+    return kExitCouldNotTell;
+}
+
+ExitStatus VerifyCommand::run(Output& output) {
+    ExitStatus status = kExitSuccess;
+    for (const std::string& path : _options.recordings) {
+        status = worse(status, verify(path, output));
+        output.flush();
+    }
+    return status;
+}
+
+ExitStatus VerifyCommand::verify(const std::string& path, Output& output) {
+    const std::string file = _options.expect.empty() ? digestFileOf(path) : _options.expect;
+    if (recordingAmong(_options.recordings, regularFile(file))) {
+        return couldNotTell(formatText("%@ is the recording itself.", {file}));
+    }
+    const auto opened = _environment.open(path);
+    if (!opened) {
+        return couldNotTell(opened.error().sentence);
+    }
+    Recording& recording = **opened;
+    if (snapshotOf(recording) != nullptr) {
+        return couldNotTell(noTimeOfSnapshot(recording.name()).sentence);
+    }
+    const auto digest = digestOf(recording, _environment.decoder);
+    if (!digest) {
+        _environment.report(digest.error().sentence);
+        const bool isForeign = digest.error().kind == RecordingError::Kind::UnknownLinkType;
+        return isForeign ? kExitCouldNotTell : kExitFailure;
+    }
+    if (_options.update) {
+        return replaceFile(file, textOfDigest(*digest))
+                   ? kExitSuccess
+                   : couldNotTell(formatText("%@ cannot be written.", {file}));
+    }
+    const auto content = readRegularFile(file, kLargestDigestFile);
+    if (!content) {
+        return couldNotTell(formatText("%@ cannot be read: %@; --update writes it.",
+                                       {file, content.error().reason}));
+    }
+    const auto before =
+        digestInText({reinterpret_cast<const char*>(content->data()), content->size()}); // NOLINT
+    if (!before) {
+        return couldNotTell(formatText("%@ cannot be used: %@.", {file, before.error().reason}));
+    }
+    const auto found = differences(*before, *digest);
+    for (const std::string& sentence : found) {
+        output.text() += recording.name() + ": " + sentence + "\n";
+        output.lineDone();
+    }
+    if (!found.empty()) {
+        return kExitFailure;
+    }
+    output.text() += formatText("%@: %llu packets, as with version %@\n",
+                                {recording.name(), digest->packets, before->decoder});
+    return kExitSuccess;
+}
+
+ExitStatus runVerify(const VerifyOptions& options) {
+    const RequiredTemplates resources(DirectoryResources::programFolder());
+    const BuildBundle bundle;
+    DroppedNotices notices;
+    const auto open = [](const std::string& path) {
+        return Recording::openInput({path, {}, complain});
+    };
+    Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
+    return VerifyCommand(options, {{resources, bundle, notices, technologies()}, open, complain})
+        .run(output);
+}
+
+} // namespace pallax
