@@ -9,6 +9,7 @@
 #include "decoding/SnapshotCommand.h"
 #include "explaining/ExplainCommand.h"
 #include "inspecting/DiffCommand.h"
+#include "inspecting/ModemCommand.h"
 #include "inspecting/StatusCommand.h"
 #include "querying/SqlCommand.h"
 #include "recording/RecordOptions.h"
@@ -38,7 +39,8 @@ struct ServiceStatusOptions {};
 using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions, InfoOptions,
-                 SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions, ParseEnd>;
+                 SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
+                 ModemListOptions, ModemPolicyOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

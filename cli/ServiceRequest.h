@@ -6,7 +6,8 @@
 
 namespace pallax {
 
-/// What the service should do: play, simulate, relay or print its status, exactly one of them.
+/// What the service should do: play, simulate, relay, watch a modem or print its status, exactly
+/// one of them.
 struct ServiceRequest {
     ServiceOptions options;
     bool status = false;
