@@ -47,7 +47,7 @@ std::optional<Source> recordingInParts(const std::vector<std::string>& paths);
 /// The path of a recording, or of its first part; nothing for a modem.
 std::optional<std::string> recordingPath(const Source& source);
 /// "drive.pcap", "standard input", "live modem", "simulated lte", "modem",
-/// "modem EM7455".
+/// "modem MB-5".
 std::string sourceName(const Source& source);
 bool isReadOnce(const Source& source);
 /// Whether the packets come from something that happens now, at its own pace.
