@@ -27,7 +27,8 @@ ModemView lteView() {
 }
 
 PropertyList section(const ModemView& view, const char* name, bool withIdentities = false) {
-    const PropertyList* found = pictureOf(view, withIdentities).find(name);
+    const Dictionary picture = pictureOf(view, withIdentities);
+    const PropertyList* found = picture.find(name);
     return found != nullptr ? *found : PropertyList();
 }
 
