@@ -16,6 +16,7 @@ constexpr std::array<Names, 1> kNoPilot{"Invalid Value"};
 
 // The state machines.
 constexpr std::array<Names, 1> kIfxRr{"ifx.rr"};
+constexpr std::array<Names, 1> kIfxTechnology{"ifx.serving_cell.technology"};
 constexpr std::array<Names, 1> kIfxModem{"ifx.modem.state"};
 constexpr std::array<Names, 1> kMm{"gsm.process_cs.mm_state"};
 constexpr std::array<Names, 1> kGmm{"gsm.process_ps.mm_state"};
@@ -73,12 +74,13 @@ constexpr std::string_view kCell = "serving cell";
 
 constexpr auto kRows = std::to_array<EventFields>({
     {"ifx", Watch::Cell, kCell, serving_cells::kIfx},
-    {"ifx", Watch::Cell, "UMTS serving cell", serving_cells::kIfxUmts},
-    {"ifx", Watch::Cell, "LTE serving cell", serving_cells::kIfxLte},
-    {"ifx", Watch::Cell, "NR serving cell", serving_cells::kIfxNr},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxUmts},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxLte},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxNr},
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxLocated},
     {"ifx", Watch::State, "RR", kIfxRr},
     {"ifx", Watch::State, "modem", kIfxModem},
+    {"ifx", Watch::State, "technology", kIfxTechnology},
     {"ifx", Watch::Service, "service", kIfxNetwork},
     {"ifx", Watch::Service, "registration", kIfxRegistration, kIfxRegistered, kIfxUnregistered},
     {"ifx", Watch::Contexts, "connection", kIfxConnections},

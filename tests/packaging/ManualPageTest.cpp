@@ -31,11 +31,11 @@ CommandDescription program() {
 
 TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
     EXPECT_EQ(manualPages(program()),
-              (std::vector<std::string>{"pallax", "pallax-decode", "pallax-record",
-                                        "pallax-service", "pallax-demo", "pallax-simulate",
-                                        "pallax-events", "pallax-fields", "pallax-explain",
-                                        "pallax-info", "pallax-snapshot", "pallax-sql",
-                                        "pallax-status", "pallax-diff", "pallax-watch"}));
+              (std::vector<std::string>{
+                  "pallax", "pallax-decode", "pallax-record", "pallax-service", "pallax-demo",
+                  "pallax-modem", "pallax-simulate", "pallax-events", "pallax-fields",
+                  "pallax-explain", "pallax-info", "pallax-snapshot", "pallax-sql", "pallax-status",
+                  "pallax-diff", "pallax-watch"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 
