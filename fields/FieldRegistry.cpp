@@ -166,8 +166,9 @@ private:
         const std::string path = _path;
         _isInList = _section->isList;
         _path += _isInList ? "/*" : "";
-        FieldInfo& info =
-            infoOf(key.name, key.labels.empty() ? FieldInfo::Kind::Text : FieldInfo::Kind::Label);
+        FieldInfo& info = infoOf(key.name, !key.unit.empty()    ? FieldInfo::Kind::Number
+                                           : key.labels.empty() ? FieldInfo::Kind::Text
+                                                                : FieldInfo::Kind::Label);
         for (const std::string_view label : key.labels) {
             addLabel(info.labels, label);
         }

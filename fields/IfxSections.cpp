@@ -84,13 +84,14 @@ std::vector<SectionReference> modemSections() {
         measured("Quality", "Signal quality as ModemManager rates it.", "%"),
         {"Recent", "Whether the quality was taken recently."},
         {"Levels", "Why there are no levels."}};
-    for (const char* system : {"GSM", "UMTS", "LTE", "NR", "1x", "EV-DO"}) {
-        for (const auto& [name, unit] :
-             {std::pair("RSSI", kDbm), std::pair("RSCP", kDbm), std::pair("RSRP", kDbm),
-              std::pair("RSRQ", kDb), std::pair("SINR", kDb), std::pair("Ec/Io", kDb)}) {
-            levels.push_back(measured(std::string(system) + " " + name,
-                                      "Level of the serving cell of that system.", unit));
-        }
+    for (const auto& [name, unit] :
+         {std::pair("GSM RSSI", kDbm), std::pair("UMTS RSSI", kDbm), std::pair("UMTS RSCP", kDbm),
+          std::pair("UMTS Ec/Io", kDb), std::pair("LTE RSSI", kDbm), std::pair("LTE RSRP", kDbm),
+          std::pair("LTE RSRQ", kDb), std::pair("LTE SINR", kDb), std::pair("NR RSRP", kDbm),
+          std::pair("NR RSRQ", kDb), std::pair("NR SINR", kDb), std::pair("1x RSSI", kDbm),
+          std::pair("1x Ec/Io", kDb), std::pair("EV-DO RSSI", kDbm), std::pair("EV-DO Ec/Io", kDb),
+          std::pair("EV-DO SINR", kDb), std::pair("EV-DO Io", kDbm)}) {
+        levels.push_back(measured(name, "Level of that system's serving cell.", unit));
     }
     return {
         keys("Registration", "The registration with a network.",

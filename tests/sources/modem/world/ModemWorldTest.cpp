@@ -196,7 +196,9 @@ TEST_F(ModemWorld, TheSampleOfAnMbimModemHasCellsWithBandFrequencyAndOperator) {
     EXPECT_EQ(events, "cell-change       serving cell 1850/120 → 1850/121 after 12 s\n"
                       "state-change      modem registered → searching\n"
                       "service-lost      registration lost: searching after 19 s\n"
+                      "state-change      technology LTE → unknown\n"
                       "state-change      modem searching → registered\n"
+                      "state-change      technology unknown → LTE\n"
                       "service-regained  registration regained: home after 6 s\n");
     const auto cells = runCommand(PALLAX_PROGRAM " sql " + sample +
                                   " \"select role, system, identity from cell\" --format csv")
