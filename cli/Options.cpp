@@ -147,8 +147,8 @@ constexpr const char* kRecordFooter = R"(Examples:
 With --rotate-size or --rotate-seconds the files are drive-0001.pcapng,
 drive-0002.pcapng, ... up to 9999. Recording stops on Ctrl-C or at the end of
 the source. A viewer can run at the same time. If no service is running, record
-says so and waits for one. With --modem it needs none, and records a modem of this
-machine through ModemManager (see pallax modem --help).
+says so and waits for one. With --modem it needs none, and records a modem of
+this machine through ModemManager (see pallax modem --help).
 
 A file holds one technology. If the modem returns with another one, recording
 continues in drive-2.pcapng, or the next free number. With --overwrite, existing

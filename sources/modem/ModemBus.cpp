@@ -321,7 +321,7 @@ BusReply ModemBus::callNow(const BusCall& call) {
         return errorOf(-ENOTCONN);
     }
     sd_bus_message* reply = nullptr;
-    sd_bus_error error = SD_BUS_ERROR_NULL;
+    sd_bus_error error{nullptr, nullptr, 0};
     const int result = sd_bus_call(_connection->bus.get(), message.get(),
                                    microseconds(call.patience), &error, &reply);
     const BusMessage received(reply);

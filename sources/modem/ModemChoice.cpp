@@ -37,7 +37,7 @@ bool isEqualIgnoringCase(std::string_view a, std::string_view b) {
 
 std::optional<std::string> ModemChoice::in(const ModemObjects& objects) {
     if (_device.empty()) {
-        const auto path = wantedIn(objects);
+        auto path = wantedIn(objects);
         if (path) {
             const std::string device = propertyOf(objects, *path, "Device");
             _device = device.empty() ? *path : device;

@@ -131,7 +131,8 @@ TEST_F(EndToEndStatus, OfService) {
     ends({{"service", "--status"}, 1, "pallax: No telephony service is running.\n"});
     ends({{"service"},
           2,
-          "pallax: the service needs --play, --simulate, --relay or --status (see pallax service "
+          "pallax: the service needs --play, --simulate, --relay, --modem or --status (see pallax "
+          "service "
           "--help)\n"});
     expectEveryDocumentedStatus({"service"});
 }

@@ -427,11 +427,11 @@ TEST(Options, AModemIsTheFirstOneOrNamed) {
 
 TEST(Options, AModemHasNoOtherSource) {
     EXPECT_EQ(wrongUsage({"modem", "--list", "--policy"}),
-              "pallax: --policy excludes --list (see pallax modem --help)\n");
+              "pallax: --list excludes --policy (see pallax modem --help)\n");
     EXPECT_EQ(wrongUsage({"service", "--with-identities"}),
               "pallax: --with-identities requires --modem (see pallax service --help)\n");
     EXPECT_EQ(wrongUsage({"service", "--modem", "--play", "a"}),
-              "pallax: --modem excludes --play (see pallax service --help)\n");
+              "pallax: --play excludes --modem (see pallax service --help)\n");
 }
 
 } // namespace
