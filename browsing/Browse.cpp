@@ -120,6 +120,8 @@ ExitStatus browse(const Request& request, SocketDirectory directory, ChildServic
     if (!isWhole) {
         complain(recordingPath(request.options.source)
                      ? "The service that plays the recording has ended."
+                 : isLive(request.options.source)
+                     ? "The service that watches the modem has ended."
                      : "The service that simulates the modem has ended.");
     }
     return isWhole && isContented ? kExitSuccess : kExitFailure;

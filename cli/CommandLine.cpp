@@ -94,6 +94,7 @@ CommandLine::CommandLine()
     CLI::App& demo = addCommand("demo", "Browse a simulated modem");
     addDemo(demo, _demo.source.emplace<SimulationOptions>(), _demo.play);
     addView(demo, _demo);
+    addModem(addCommand("modem", "Browse a modem of this machine"), _modem);
     addSimulate(addCommand("simulate", "Write a simulated modem's packets to a recording"),
                 _simulate);
     addEvents(addCommand("events", "List what happened in recordings"), _events);
@@ -218,6 +219,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("demo")) {
         return _demo;
+    }
+    if (_app->got_subcommand("modem")) {
+        return modemOptions(_modem);
     }
     if (_app->got_subcommand("simulate")) {
         return _simulate;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "cli/CommandDescription.h"
+#include "cli/ModemOptions.h"
 #include "cli/Options.h"
 #include "cli/ServiceRequest.h"
 
@@ -35,6 +36,7 @@ private:
     std::unique_ptr<CLI::App> _app;
     BrowseOptions _browse;
     BrowseOptions _demo;
+    ModemRequest _modem;
     DecodeOptions _decode;
     ExplainOptions _explain;
     EventsOptions _events;

@@ -2,6 +2,7 @@
 
 #include "cli/Amounts.h"
 #include "cli/CommandLine.h"
+#include "cli/ModemOptions.h"
 #include "cli/OptionParts.h"
 #include "cli/SimulateOptions.h"
 #include "text/Format.h"
@@ -21,6 +22,7 @@ constexpr const char* kFooter = R"(Examples:
   modem-dump | pallax -                browse what another program records
   pallax --connect car1 --connect car2     browse two live modems side by side
   pallax demo                          browse a simulated modem
+  pallax modem                         browse a modem of this machine
   pallax decode drive.pcap             print its last display as JSON
   pallax decode --every tick --format csv drive.pcap > drive.csv
   pallax record drive.pcapng           record the live modem
@@ -144,12 +146,14 @@ Exit status:
 constexpr const char* kRecordFooter = R"(Examples:
   pallax record drive.pcapng
   pallax record --technology lte --rotate-size 100M drive.pcapng
+  pallax record --modem drive.pcapng
   pallax record - | ssh desk pallax service --relay -
 
 With --rotate-size or --rotate-seconds the files are drive-0001.pcapng,
 drive-0002.pcapng, ... up to 9999. Recording stops on Ctrl-C or at the end of
 the source. A viewer can run at the same time. If no service is running, record
-says so and waits for one.
+says so and waits for one. With --modem it needs none, and records a modem of
+this machine through ModemManager (see pallax modem --help).
 
 A file holds one technology. If the modem returns with another one, recording
 continues in drive-2.pcapng, or the next free number. With --overwrite, existing
@@ -294,6 +298,12 @@ void addRecord(CLI::App& app, RecordOptions& options) {
         ->type_name("");
     addTechnology(app, "--technology", options.technology,
                   "Refuse a modem that speaks another technology");
+    addModemSource(
+        app,
+        [&options]() -> LocalModem& {
+            return options.modem ? *options.modem : options.modem.emplace();
+        },
+        "Record a modem of this machine, by default the first one that is enabled");
     const auto takeSize = [&options](const std::string& text) {
         const auto size = parseSize(text);
         if (!size) {

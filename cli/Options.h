@@ -9,6 +9,7 @@
 #include "decoding/SnapshotCommand.h"
 #include "explaining/ExplainCommand.h"
 #include "inspecting/DiffCommand.h"
+#include "inspecting/ModemCommand.h"
 #include "inspecting/StatusCommand.h"
 #include "masking/MaskCommand.h"
 #include "querying/SqlCommand.h"
@@ -46,7 +47,7 @@ using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  ServiceListOptions, SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions,
                  InfoOptions, SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
-                 MaskOptions, VerifyOptions, ParseEnd>;
+                 MaskOptions, VerifyOptions, ModemListOptions, ModemPolicyOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -1,5 +1,6 @@
 #include "cli/ServiceRequest.h"
 
+#include "cli/ModemOptions.h"
 #include "cli/OptionParts.h"
 #include "cli/SimulateOptions.h"
 
@@ -14,13 +15,15 @@ constexpr const char* kServiceFooter = R"(Examples:
   pallax service --simulate ifx --seconds 600 --speed max
   ssh phone modem-dump | pallax service --relay -
   pallax service --name car1 --simulate lte
+  pallax service --modem
   pallax service --status
   pallax service --list
 
 Each client gets its own channel. A recording or simulation restarts for each
 client; a named pipe is played once, to the first. A relayed stream goes live to
 all clients, after a wait for the first one (--wait), and the service ends with
-it.
+it. A modem of this machine (--modem, see pallax modem --help) is live, too; the
+service stays while it is unplugged.
 A slow client loses packets but delays no other client; with --speed max it sets
 its own pace and loses nothing.
 
@@ -77,13 +80,27 @@ void addServiceRelay(CLI::App& app, ServiceOptions& options) {
         ->needs("--relay");
 }
 
+void addServiceModem(CLI::App& app, ServiceOptions& options) {
+    const auto modem = [&options]() -> LocalModem& {
+        auto* local = std::get_if<LocalModem>(&options.source);
+        return local != nullptr ? *local : options.source.emplace<LocalModem>();
+    };
+    addModemSource(app, modem,
+                   "Serve a modem of this machine, by default the first one that is enabled")
+        ->excludes("--play")
+        ->excludes("--speed") // the modem sets the pace
+        ->excludes("--simulate")
+        ->excludes("--relay");
+}
+
 /// A flag that prints something instead of running the service.
 CLI::Option* addPrinting(CLI::App& app, const char* name, bool& flag, const char* description) {
     return app.add_flag(name, flag, description)
         ->excludes("--play")
         ->excludes("--speed")
         ->excludes("--simulate")
-        ->excludes("--relay");
+        ->excludes("--relay")
+        ->excludes("--modem");
 }
 
 void addServiceName(CLI::App& app, std::string& name) {
@@ -100,6 +117,7 @@ void addService(CLI::App& app, ServiceRequest& request) {
     addServicePlay(app, request.options);
     addServiceSimulation(app, request.options.source)->excludes("--play");
     addServiceRelay(app, request.options);
+    addServiceModem(app, request.options);
     addServiceName(app, request.options.name);
     addPrinting(app, "--status", request.status,
                 "Print the status of the running service and exit");
@@ -118,8 +136,9 @@ ParsedOptions serviceOptions(const ServiceRequest& request) {
     }
     const Source& source = request.options.source;
     if (std::holds_alternative<ServiceModem>(source) || recordingPath(source) == "") {
-        return wrongUsage("the service needs --play, --simulate, --relay, --status or --list",
-                          "service");
+        return wrongUsage(
+            "the service needs --play, --simulate, --relay, --modem, --status or --list",
+            "service");
     }
     return request.options;
 }

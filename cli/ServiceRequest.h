@@ -6,8 +6,8 @@
 
 namespace pallax {
 
-/// What the service should do: play, simulate, relay, print its status or list those that run,
-/// exactly one of them.
+/// What the service should do: play, simulate, relay, watch a modem, print its status or list those
+/// that run, exactly one of them.
 struct ServiceRequest {
     ServiceOptions options;
     bool status = false;

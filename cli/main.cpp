@@ -7,6 +7,7 @@
 #include "decoding/SnapshotCommand.h"
 #include "host/Complaint.h"
 #include "host/StandardDescriptors.h"
+#include "inspecting/ModemCommand.h"
 #include "live/LiveEvents.h"
 #include "recording/Record.h"
 #include "telephony/ChildService.h"
@@ -48,6 +49,10 @@ struct Run {
     ExitStatus operator()(const WatchOptions& options) const { return runWatch(options); }
     ExitStatus operator()(const MaskOptions& options) const { return runMask(options); }
     ExitStatus operator()(const VerifyOptions& options) const { return runVerify(options); }
+    ExitStatus operator()(const ModemListOptions& options) const { return runModemList(options); }
+    ExitStatus operator()(const ModemPolicyOptions& options) const {
+        return runModemPolicy(options);
+    }
     ExitStatus operator()(const ParseEnd& end) const {
         if (end.status == kExitSuccess) {
             writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);

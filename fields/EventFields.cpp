@@ -16,6 +16,8 @@ constexpr std::array<Names, 1> kNoPilot{"Invalid Value"};
 
 // The state machines.
 constexpr std::array<Names, 1> kIfxRr{"ifx.rr"};
+constexpr std::array<Names, 1> kIfxTechnology{"ifx.serving_cell.technology"};
+constexpr std::array<Names, 1> kIfxModem{"ifx.modem.state"};
 constexpr std::array<Names, 1> kMm{"gsm.process_cs.mm_state"};
 constexpr std::array<Names, 1> kGmm{"gsm.process_ps.mm_state"};
 constexpr std::array<Names, 1> kRr{"gsm.gsm_rr_info.rr_state"};
@@ -33,6 +35,17 @@ constexpr std::array<Names, 3> kToGsm{"RR_W2G_INTERRAT_RESELECTION_PROGRESS",
 
 // Service and registration.
 constexpr std::array<Names, 1> kIfxNetwork{"ifx.network.mcc"};
+constexpr std::array<Names, 1> kIfxRegistration{"ifx.registration.state"};
+constexpr std::array<Names, 7> kIfxRegistered{"home",
+                                              "roaming",
+                                              "registered",
+                                              "home, SMS only",
+                                              "roaming, SMS only",
+                                              "home, CSFB not preferred",
+                                              "roaming, CSFB not preferred"};
+constexpr std::array<Names, 8> kIfxUnregistered{
+    "idle",     "searching", "denied",        "unknown",
+    "no modem", "unplugged", "no system bus", "ModemManager is not running"};
 constexpr std::array<Names, 1> kServiceType{"gsm.serving_plmn.service_type"};
 constexpr std::array<Names, 3> kService{"CS_ONLY", "PS_ONLY", "CS_PS_SERVICE"};
 constexpr std::array<Names, 2> kNoService{"NO_SERVICE", "LIMITED_SERVICE"};
@@ -52,6 +65,7 @@ constexpr std::array<Names, 3> kEvdoService{"Idle [3]", "Access [4]", "Connected
 constexpr std::array<Names, 2> kEvdoLost{"Inactive [0]", "Acquisition [1]"};
 
 // Contexts.
+constexpr std::array<Names, 1> kIfxConnections{"ifx.data_connections.apn"};
 constexpr std::array<Names, 1> kGsmContexts{"gsm.pdp_context_info"};
 constexpr std::array<Names, 1> kLteContexts{"lte.pdp_context_info"};
 constexpr std::array<Names, 1> kUtranContexts{"utran.pdp_context_info"};
@@ -60,8 +74,16 @@ constexpr std::string_view kCell = "serving cell";
 
 constexpr auto kRows = std::to_array<EventFields>({
     {"ifx", Watch::Cell, kCell, serving_cells::kIfx},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxUmts},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxLte},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxNr},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxLocated},
     {"ifx", Watch::State, "RR", kIfxRr},
+    {"ifx", Watch::State, "modem", kIfxModem},
+    {"ifx", Watch::State, "technology", kIfxTechnology},
     {"ifx", Watch::Service, "service", kIfxNetwork},
+    {"ifx", Watch::Service, "registration", kIfxRegistration, kIfxRegistered, kIfxUnregistered},
+    {"ifx", Watch::Contexts, "connection", kIfxConnections},
 
     {"gsm", Watch::Technology, "GSM → UMTS", kRr, kToUmts},
     {"gsm", Watch::Technology, "UMTS → GSM", kRr, kToGsm},

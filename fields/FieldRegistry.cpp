@@ -169,7 +169,15 @@ private:
         const std::string path = _path;
         _isInList = _section->isList;
         _path += _isInList ? "/*" : "";
-        infoOf(key.name, FieldInfo::Kind::Text).identifies = key.isIdentifying;
+        FieldInfo& info = infoOf(key.name, !key.unit.empty()    ? FieldInfo::Kind::Number
+                                           : key.labels.empty() ? FieldInfo::Kind::Text
+                                                                : FieldInfo::Kind::Label);
+        for (const std::string_view label : key.labels) {
+            addLabel(info.labels, label);
+        }
+        info.identifies = key.isIdentifying;
+        info.isPersonal = key.isPersonal;
+        info.unit = key.unit;
         _path = path;
         _isInList = false;
     }

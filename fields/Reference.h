@@ -16,6 +16,9 @@ struct ObjectKey {
     std::string name;
     std::string_view meaning{}; ///< a sentence
     bool isIdentifying = false; ///< part of the entry's identity
+    bool isPersonal = false;    ///< identifies a person, a device or a subscription
+    std::string_view unit = {};
+    std::vector<std::string_view> labels = {}; ///< its texts, if they are known
 };
 
 /// One section of a technology's display and its log codes.

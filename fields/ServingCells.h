@@ -9,6 +9,14 @@ namespace pallax::serving_cells {
 
 inline constexpr std::array<std::string_view, 2> kIfx{"ifx.serving_cell.arfcn",
                                                       "ifx.serving_cell.bsic"};
+inline constexpr std::array<std::string_view, 2> kIfxUmts{"ifx.serving_cell.uarfcn",
+                                                          "ifx.serving_cell.scrambling_code"};
+inline constexpr std::array<std::string_view, 2> kIfxLte{"ifx.serving_cell.earfcn",
+                                                         "ifx.serving_cell.physical_cell_id"};
+inline constexpr std::array<std::string_view, 2> kIfxNr{"ifx.serving_cell.nr_arfcn",
+                                                        "ifx.serving_cell.physical_cell_id"};
+/// Where only the location tells of the cell.
+inline constexpr std::array<std::string_view, 1> kIfxLocated{"ifx.serving_cell.cell_id"};
 inline constexpr std::array<std::string_view, 2> kGsm{"gsm.gsm_serving_cell.arfcn",
                                                       "gsm.gsm_serving_cell.bsic"};
 inline constexpr std::array<std::string_view, 2> kUmts{"gsm.umts_rr_info.scrambling_code",

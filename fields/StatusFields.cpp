@@ -118,6 +118,55 @@ constexpr auto kIfx = std::to_array<StatusField>({
     {Kind::Channel, "ARFCN", "ifx.serving_cell.arfcn"},
     {Kind::Level, "RxLev", "ifx.serving_cell.rx_level"},
 });
+constexpr auto kIfxUmts = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.serving_cell.cell_id"},
+    {Kind::Identity, "PSC", "ifx.serving_cell.scrambling_code"},
+    {Kind::Identity, "LAC", "ifx.serving_cell.lac"},
+    {Kind::Channel, "UARFCN", "ifx.serving_cell.uarfcn"},
+    {Kind::Level, "RSCP", "ifx.serving_cell.rscp"},
+    {Kind::Level, "Ec/Io", "ifx.serving_cell.ec_io"},
+});
+constexpr auto kIfxLte = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.serving_cell.cell_id"},
+    {Kind::Identity, "PCI", "ifx.serving_cell.physical_cell_id"},
+    {Kind::Identity, "TAC", "ifx.serving_cell.tac"},
+    {Kind::Channel, "EARFCN", "ifx.serving_cell.earfcn"},
+    {Kind::Level, "RSRP", "ifx.serving_cell.rsrp"},
+    {Kind::Level, "RSRQ", "ifx.serving_cell.rsrq"},
+    {Kind::Level, "SINR", "ifx.serving_cell.sinr"},
+});
+constexpr auto kIfxNr = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.serving_cell.cell_id"},
+    {Kind::Identity, "PCI", "ifx.serving_cell.physical_cell_id"},
+    {Kind::Identity, "TAC", "ifx.serving_cell.tac"},
+    {Kind::Channel, "NR-ARFCN", "ifx.serving_cell.nr_arfcn"},
+    {Kind::Level, "RSRP", "ifx.serving_cell.rsrp"},
+    {Kind::Level, "RSRQ", "ifx.serving_cell.rsrq"},
+    {Kind::Level, "SINR", "ifx.serving_cell.sinr"},
+});
+constexpr auto kIfxUmtsNeighbours = std::to_array<StatusField>({
+    {Kind::Identity, "UARFCN", "ifx.neighbour_cells.uarfcn"},
+    {Kind::Identity, "PSC", "ifx.neighbour_cells.scrambling_code"},
+});
+constexpr auto kIfxLteNeighbours = std::to_array<StatusField>({
+    {Kind::Identity, "EARFCN", "ifx.neighbour_cells.earfcn"},
+    {Kind::Identity, "PCI", "ifx.neighbour_cells.physical_cell_id"},
+});
+constexpr auto kIfxNrNeighbours = std::to_array<StatusField>({
+    {Kind::Identity, "NR-ARFCN", "ifx.neighbour_cells.nr_arfcn"},
+    {Kind::Identity, "PCI", "ifx.neighbour_cells.physical_cell_id"},
+});
+constexpr std::string_view kIfxSystem = "ifx.serving_cell.technology";
+constexpr std::string_view kIfxNeighbourSystem = "ifx.neighbour_cells.technology";
+constexpr auto kIfxUmtsLists = std::to_array<StatusList>({
+    {"RSCP", "ifx.neighbour_cells.rscp", kIfxUmtsNeighbours, {}, {kIfxNeighbourSystem, "UMTS"}},
+});
+constexpr auto kIfxLteLists = std::to_array<StatusList>({
+    {"RSRP", "ifx.neighbour_cells.rsrp", kIfxLteNeighbours, {}, {kIfxNeighbourSystem, "LTE"}},
+});
+constexpr auto kIfxNrLists = std::to_array<StatusList>({
+    {"RSRP", "ifx.neighbour_cells.rsrp", kIfxNrNeighbours, {}, {kIfxNeighbourSystem, "NR"}},
+});
 constexpr auto kIfxNeighbours = std::to_array<StatusField>({
     {Kind::Identity, "ARFCN", "ifx.neighbour_cells.arfcn"},
     {Kind::Identity, "BSIC", "ifx.neighbour_cells.bsic"},
@@ -127,7 +176,11 @@ constexpr auto kIfxLists = std::to_array<StatusList>({
 });
 
 constexpr auto kStatusCells = std::to_array<StatusCellFields>({
-    {"ifx", "GSM", RadioSystem::Gsm, kIfx, kIfxLists},
+    {"ifx", "GSM", RadioSystem::Gsm, kIfx, kIfxLists, {kIfxSystem, ""}},
+    {"ifx", "GSM", RadioSystem::Gsm, kIfx, {}, {kIfxSystem, "GSM"}},
+    {"ifx", "UMTS", RadioSystem::UmtsFdd, kIfxUmts, kIfxUmtsLists, {kIfxSystem, "UMTS"}},
+    {"ifx", "LTE", RadioSystem::Lte, kIfxLte, kIfxLteLists, {kIfxSystem, "LTE"}},
+    {"ifx", "NR", RadioSystem::Nr, kIfxNr, kIfxNrLists, {kIfxSystem, "NR"}},
     {"gsm", "GSM", RadioSystem::Gsm, kGsm, kGsmLists},
     {"gsm", "UMTS", RadioSystem::UmtsFdd, kUmts, kUmtsLists},
     {"cdma", "1x", RadioSystem::Cdma, kOneX, kOneXLists},
@@ -141,6 +194,11 @@ constexpr auto kNetworks = std::to_array<StatusNetworkFields>({
      .name = "ifx.network.name",
      .mcc = "ifx.network.mcc",
      .mnc = "ifx.network.mnc"},
+    {.technology = "ifx",
+     .name = "ifx.registration.operator",
+     .code = "ifx.registration.operator_code",
+     .simName = "ifx.sim.operator",
+     .simNetwork = "ifx.sim.operator_code"},
     {.technology = "gsm",
      .mcc = "gsm.serving_plmn.mobile_country_code",
      .mnc = "gsm.serving_plmn.mobile_network_code",
@@ -155,6 +213,9 @@ constexpr auto kNetworks = std::to_array<StatusNetworkFields>({
 });
 
 constexpr auto kRunning = std::to_array<std::string_view>({
+    "ifx.data_connections.duration",
+    "ifx.data_connections.received",
+    "ifx.data_connections.sent",
     "lte.connected_mode_lte_intra_frequency_measurement.subframe_number",
     "lte.neighbor_cells_list.ant_0_frame_offset",
     "lte.neighbor_cells_list.ant_0_sample_offset",

@@ -23,6 +23,13 @@ struct StatusField {
     std::string_view field; ///< as in the registry
 };
 
+/// The value that a field must have: what one modem tells of cells of every system counts only for
+/// the system that it names.
+struct StatusCondition {
+    std::string_view field = {}; ///< empty: nothing is required
+    std::string_view text = {};  ///< empty: the field must have no value
+};
+
 /// A list of cells with their levels. An entry that has the serving cell's values under the same
 /// names is the serving cell; all others are neighbours.
 struct StatusList {
@@ -33,6 +40,7 @@ struct StatusList {
     std::span<const StatusField> identity;
     /// What the text of the level begins with in the entry of the serving cell, if it is marked.
     std::string_view servingMark = {};
+    StatusCondition only = {}; ///< of an entry
 };
 
 /// What a status says about the serving cell of one system, and from which fields. Of fields with
@@ -43,16 +51,19 @@ struct StatusCellFields {
     RadioSystem system;
     std::span<const StatusField> fields;
     std::span<const StatusList> lists;
+    StatusCondition only = {}; ///< of the fields
 };
 std::span<const StatusCellFields> statusCells();
 
-/// Where a technology tells its network and its names. States and contexts are those of the events
+/// Where a technology tells its network and its names; of several rows, the first one that has a
+/// value counts. States and contexts are those of the events
 /// (EventFields).
 struct StatusNetworkFields {
     std::string_view technology;
     std::string_view name = {}; ///< given by the network
     std::string_view mcc = {};
     std::string_view mnc = {};
+    std::string_view code = {};       ///< both in one
     std::string_view simName = {};    ///< of the network of the card
     std::string_view simNetwork = {}; ///< its code
 };

@@ -31,7 +31,7 @@ const RecordedTechnology* technologyOf(const PropertyList& answer) {
 
 PacketReceiver::PacketReceiver(Setup setup)
     : _setup(std::move(setup)), _link(_queue, std::move(_setup.directory), OnFatalRecord::Skip,
-                                      nullptr, _notices, receivingPortName(_setup.program)),
+                                      _setup.child, _notices, receivingPortName(_setup.program)),
       _modem(platform(), *this) {}
 
 ModemLink::Platform PacketReceiver::platform() {
@@ -57,6 +57,13 @@ void PacketReceiver::start() {
     queue.async([this] { _modem.startMonitor(); });
     _notice.emplace(WaitNotice::Setup{queue, [this] { return _modem.isConnected(); },
                                       [this] { return _link.obstacle(); }, _setup.waits});
+    if (_link.hasChild()) {
+        _looks = queue.scheduleRepeating(BrowseLink::kLookInterval, [this] {
+            if (_link.childHasEnded()) {
+                fail("The service of the recorder has ended.");
+            }
+        });
+    }
     if (_setup.duration) {
         _end = _link.clock().scheduleRepeating(*_setup.duration, [this] { stop(); });
     }

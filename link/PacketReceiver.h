@@ -34,6 +34,8 @@ public:
         /// How long it receives, by the time of the source or, before its first packet, of this
         /// machine; if missing, without an end.
         std::optional<std::chrono::nanoseconds> duration = {};
+        /// The service to connect to; null: the machine's own.
+        ChildService* child = nullptr;
     };
 
     explicit PacketReceiver(Setup setup);
@@ -77,6 +79,7 @@ private:
     ModemLink _modem;
     std::optional<WaitNotice> _notice; // once it runs
     std::unique_ptr<RepeatingTimer> _end;
+    std::unique_ptr<RepeatingTimer> _looks; // at the child
 };
 
 } // namespace pallax

@@ -9,6 +9,7 @@
 #include "timeline/EventFinder.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <utility>
 
@@ -92,16 +93,18 @@ public:
     }
 
 private:
-    StatusValue valueOf(std::string_view name, std::string_view field, const FieldValue& value) {
+    StatusValue valueOf(std::string_view name, std::string_view field,
+                        const FieldValue& value) const {
         return {
             std::string(name), std::string(field), value.text(), value.number, {}, value.read, {}};
     }
-    StatusValue identityOf(const StatusField& field, const FieldValue& value) {
+    StatusValue identityOf(const StatusField& field, const FieldValue& value) const {
         StatusValue identity = valueOf(field.name, field.field, value);
         identity.text = identityText(value);
         return identity;
     }
-    StatusValue levelOf(std::string_view name, std::string_view field, const FieldValue& value) {
+    StatusValue levelOf(std::string_view name, std::string_view field,
+                        const FieldValue& value) const {
         StatusValue level = valueOf(name, field, value);
         level.grade =
             std::isfinite(value.number) ? qualityOf(_profile, field, value.number) : std::nullopt;
@@ -112,7 +115,21 @@ private:
         return value != nullptr && tells(*value) ? value : nullptr;
     }
 
+    bool holds(const StatusCondition& condition) const {
+        const FieldValue* value =
+            condition.field.empty() ? nullptr : _values.value(condition.field);
+        return condition.field.empty() ||
+               condition.text == (value != nullptr ? value->text() : std::string());
+    }
+    bool holds(const StatusCondition& condition, const EntryValues& entry) const {
+        return condition.field.empty() ||
+               std::any_of(entry.values.begin(), entry.values.end(), [&](const auto& held) {
+                   return _fields[held.first].name == condition.field &&
+                          held.second.text() == condition.text;
+               });
+    }
     void addCell(const StatusCellFields& rule);
+    void addFields(StatusCell& cell, const StatusCellFields& rule) const;
     static void addLevel(StatusCell& cell, StatusValue level);
     void addChannel(StatusCell& cell, const StatusCellFields& rule, const FieldValue* band) const;
     void addList(StatusCell& cell, const StatusCellFields& rule, const StatusList& list);
@@ -121,6 +138,12 @@ private:
                                                              const EntryValues& entry) const;
     void addNeighbour(StatusNeighbour neighbour);
     void addStatesAndContexts();
+    bool isTold(const StatusNetworkFields& rule) const {
+        const std::array fields{rule.name, rule.mcc, rule.code, rule.simName, rule.simNetwork};
+        return std::any_of(fields.begin(), fields.end(), [this](std::string_view field) {
+            return !field.empty() && _values.value(field) != nullptr;
+        });
+    }
     void addNetwork(const NetworkNames& names);
 
     const CurrentValues& _values;
@@ -137,6 +160,18 @@ bool isNamed(const std::vector<StatusValue>& values, std::string_view name) {
 void Gathering::addCell(const StatusCellFields& rule) {
     StatusCell cell;
     cell.system = rule.name;
+    if (holds(rule.only)) {
+        addFields(cell, rule);
+    }
+    for (const StatusList& list : rule.lists) {
+        addList(cell, rule, list);
+    }
+    if (!cell.identity.empty() || cell.channel || !cell.levels.empty()) {
+        _status.cells.push_back(std::move(cell));
+    }
+}
+
+void Gathering::addFields(StatusCell& cell, const StatusCellFields& rule) const {
     const FieldValue* band = nullptr;
     for (const StatusField& field : rule.fields) {
         const FieldValue* value = find(field.field);
@@ -173,12 +208,6 @@ void Gathering::addCell(const StatusCellFields& rule) {
         }
     }
     addChannel(cell, rule, band);
-    for (const StatusList& list : rule.lists) {
-        addList(cell, rule, list);
-    }
-    if (!cell.identity.empty() || cell.channel || !cell.levels.empty()) {
-        _status.cells.push_back(std::move(cell));
-    }
 }
 
 /// Of levels with the same name, the one that was read last counts.
@@ -258,7 +287,7 @@ void Gathering::addList(StatusCell& cell, const StatusCellFields& rule, const St
     }
     _values.forEachEntry([&](const EntryValues& entry) {
         for (const auto& [field, value] : entry.values) {
-            if (field != *level || !tells(value)) {
+            if (field != *level || !tells(value) || !holds(list.only, entry)) {
                 continue;
             }
             const auto names = namesOf(list, entry);
@@ -322,8 +351,9 @@ void Gathering::addStatesAndContexts() {
 
 void Gathering::addNetwork(const NetworkNames& names) {
     const auto rule =
-        std::find_if(statusNetworks().begin(), statusNetworks().end(),
-                     [this](const auto& each) { return each.technology == _fields.technology(); });
+        std::find_if(statusNetworks().begin(), statusNetworks().end(), [this](const auto& each) {
+            return each.technology == _fields.technology() && isTold(each);
+        });
     if (rule == statusNetworks().end()) {
         return;
     }
@@ -333,10 +363,11 @@ void Gathering::addNetwork(const NetworkNames& names) {
     };
     StatusOperator network;
     const auto home = NetworkCode::in(textOf(rule->simNetwork));
-    network.code = NetworkCode::in(textOf(rule->mcc) + " " + textOf(rule->mnc));
+    network.code = rule->code.empty() ? NetworkCode::in(textOf(rule->mcc) + " " + textOf(rule->mnc))
+                                      : NetworkCode::in(textOf(rule->code));
     if (!network.code) {
         network.code = home;
-        network.isHome = rule->mcc.empty() && home;
+        network.isHome = rule->mcc.empty() && rule->code.empty() && home;
     }
     const std::string given = textOf(rule->name);
     const std::string stored = network.code == home ? textOf(rule->simName) : std::string();

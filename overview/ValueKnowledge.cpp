@@ -28,8 +28,15 @@ struct StatusRole {
     RadioSystem system;
     StatusField::Role role;
 };
-std::optional<StatusRole> roleOf(const FieldInfo& field) {
+std::optional<StatusRole> roleOf(const CurrentValues& values, const FieldInfo& field) {
+    const auto isOther = [&values](const StatusCondition& only) {
+        const FieldValue* value = only.field.empty() ? nullptr : values.value(only.field);
+        return value != nullptr && value->text() != only.text;
+    };
     for (const StatusCellFields& cell : statusCells()) {
+        if (isOther(cell.only)) {
+            continue;
+        }
         for (const StatusField& each : cell.fields) {
             if (each.field == field.name) {
                 return StatusRole{cell.system, each.role};
@@ -78,7 +85,7 @@ std::vector<std::string> wordsOfChannel(RadioSystem system, std::uint32_t number
 std::optional<NetworkCode> networkOf(const CurrentValues& values, const FieldInfo& field,
                                      const FieldValue& value) {
     for (const StatusNetworkFields& rule : statusNetworks()) {
-        if (field.name == rule.simNetwork) {
+        if (field.name == rule.simNetwork || (!rule.code.empty() && field.name == rule.code)) {
             return NetworkCode::in(value.text());
         }
         if (field.name == rule.mcc || field.name == rule.mnc) {
@@ -107,7 +114,7 @@ std::string networkWords(const NetworkCode& code, const NetworkNames& names) {
 std::vector<std::string> knowledgeOf(const CurrentValues& values, const FieldInfo& field,
                                      const FieldValue& value, const NetworkNames& names) {
     const auto number = wholeNumber(value.number);
-    const auto role = roleOf(field);
+    const auto role = roleOf(values, field);
     auto system = systemOfChannel(field);
     if (!system && role && role->role == StatusField::Role::Channel) {
         system = role->system;

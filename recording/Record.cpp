@@ -10,6 +10,7 @@
 #include "link/WaitNotice.h"
 #include "recording/RecordOptions.h"
 #include "recording/Recorder.h"
+#include "telephony/ChildService.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -40,6 +41,15 @@ ExitStatus record(const RecordOptions& options) {
         complain(files.error().sentence);
         return kExitFailure;
     }
+    std::unique_ptr<ChildService> child;
+    if (options.modem) {
+        auto started = ChildService::start({*options.modem});
+        if (!started) {
+            complain(started.error().sentence);
+            return kExitFailure;
+        }
+        child = std::move(started).value();
+    }
     std::optional<std::string> failure;
     {
         Recorder recorder(
@@ -48,7 +58,8 @@ ExitStatus record(const RecordOptions& options) {
             [&progress](const std::string& text) {
                 progress.wipe();
                 complainOfWaiting(text);
-            });
+            },
+            child.get());
         failure = recorder.run();
     }
     progress.leave();

@@ -14,13 +14,13 @@ constexpr std::chrono::seconds kProgressInterval{1};
 } // namespace
 
 Recorder::Recorder(SocketDirectory directory, const RecordedTechnology* wanted,
-                   RecordingFiles& files, Progress progress, Progress waits)
+                   RecordingFiles& files, Progress progress, Progress waits, ChildService* child)
     : _files(files), _progress(std::move(progress)),
       _receiver({std::move(directory), "Recorder", wanted,
                  [this](const RecordedTechnology& technology, Time stamp, Bytes packet) {
                      add(technology, stamp, packet);
                  },
-                 std::move(waits)}) {}
+                 std::move(waits), std::nullopt, child}) {}
 
 std::optional<std::string> Recorder::run() {
     const auto looks =

@@ -18,9 +18,9 @@ public:
     /// Receives the progress about once a second.
     using Progress = std::function<void(const std::string& text)>;
 
-    /// `waits` receives the texts of WaitNotice.
+    /// `waits` receives the texts of WaitNotice; `child` is null for the machine's own service.
     Recorder(SocketDirectory directory, const RecordedTechnology* wanted, RecordingFiles& files,
-             Progress progress, Progress waits);
+             Progress progress, Progress waits, ChildService* child = nullptr);
 
     /// Records until a signal, the end of the source, the loss of a pipe's reader, or a failure,
     /// whose sentence it returns.

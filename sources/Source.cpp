@@ -5,6 +5,7 @@
 #include "host/RecordingFile.h"
 #include "host/RecordingParts.h"
 #include "host/ServiceName.h"
+#include "sources/modem/ModemChoice.h"
 
 #include <charconv>
 #include <map>
@@ -23,6 +24,11 @@ constexpr std::string_view kService = "service";
 constexpr std::string_view kFile = "file";
 constexpr std::string_view kStream = "stream";
 constexpr std::string_view kSimulated = "simulated";
+constexpr std::string_view kModem = "modem";
+
+/// The last argument of a modem.
+constexpr std::string_view kWithIdentities = "with-identities";
+constexpr std::string_view kWithoutIdentities = "";
 
 /// The arguments of a simulation; the last may be missing.
 enum SimulationArgument {
@@ -119,21 +125,27 @@ std::optional<std::string> recordingPath(const Source& source) {
 }
 
 std::string sourceName(const Source& source) {
-    return std::visit(Visitor{[](const ServiceModem& modem) { return liveModemName(modem.name); },
-                              [](const FileRecording& file) {
-                                  return JoinedRecording::nameOf(file.path, file.further.size());
-                              },
-                              [](const StreamedRecording& stream) {
-                                  const std::string path = stream.path == kStandardInput
-                                                               ? "standard input"
-                                                               : stream.path;
-                                  return stream.name.empty() ? path : stream.name;
-                              },
-                              [](const SimulationOptions& simulation) {
-                                  return "simulated " +
-                                         std::string(simulation.technology->commandName);
-                              }},
-                      source);
+    return std::visit(
+        Visitor{[](const ServiceModem& modem) { return liveModemName(modem.name); },
+                [](const FileRecording& file) {
+                    return JoinedRecording::nameOf(file.path, file.further.size());
+                },
+                [](const StreamedRecording& stream) {
+                    const std::string path =
+                        stream.path == kStandardInput ? "standard input" : stream.path;
+                    return stream.name.empty() ? path : stream.name;
+                },
+                [](const SimulationOptions& simulation) {
+                    return "simulated " + std::string(simulation.technology->commandName);
+                },
+                [](const LocalModem& modem) {
+                    return modem.wanted == ModemChoice::kAuto ? "modem" : "modem " + modem.wanted;
+                }},
+        source);
+}
+
+bool isLive(const Source& source) {
+    return std::holds_alternative<LocalModem>(source);
 }
 
 bool isReadOnce(const Source& source) {
@@ -164,6 +176,11 @@ std::vector<std::string> argumentsOf(const Source& source) {
                         arguments.push_back(std::to_string(simulation.duration->count()));
                     }
                     return arguments;
+                },
+                [](const LocalModem& modem) {
+                    return Arguments{
+                        std::string(kModem), modem.wanted,
+                        std::string(modem.withIdentities ? kWithIdentities : kWithoutIdentities)};
                 }},
         source);
 }
@@ -182,6 +199,9 @@ std::optional<Source> sourceOf(std::span<const std::string> arguments) {
     }
     if (kind == kStream && count == 3) {
         return StreamedRecording{arguments[1], arguments[2]};
+    }
+    if (kind == kModem && count == 3) {
+        return LocalModem{arguments[1], arguments[2] == kWithIdentities};
     }
     return kind == kSimulated ? simulationOf(arguments) : std::nullopt;
 }

@@ -29,8 +29,16 @@ struct StreamedRecording {
     std::string name = {}; ///< for messages; if empty, the path
 };
 
+/// A modem of this machine, through ModemManager.
+struct LocalModem {
+    std::string wanted; ///< see ModemChoice
+    /// The messages hold what identifies a person, a device or a subscription.
+    bool withIdentities = false;
+};
+
 /// Where packets come from. A simulated modem is named by its options.
-using Source = std::variant<ServiceModem, FileRecording, StreamedRecording, SimulationOptions>;
+using Source =
+    std::variant<ServiceModem, FileRecording, StreamedRecording, SimulationOptions, LocalModem>;
 
 /// The recording at a path of the command line.
 Source recordingAt(std::string path);
@@ -40,9 +48,12 @@ std::optional<Source> recordingInParts(const std::vector<std::string>& paths);
 
 /// The path of a recording, or of its first part; nothing for a modem.
 std::optional<std::string> recordingPath(const Source& source);
-/// "drive.pcap", "standard input", "live modem" or the name of its service, "simulated lte".
+/// "drive.pcap", "standard input", "live modem" or the name of its service, "simulated lte",
+/// "modem", "modem MB-5".
 std::string sourceName(const Source& source);
 bool isReadOnce(const Source& source);
+/// Whether the packets come from something that happens now, at its own pace.
+bool isLive(const Source& source);
 
 /// The source as arguments of a command, its kind first.
 std::vector<std::string> argumentsOf(const Source& source);

@@ -1,6 +1,8 @@
 #include "sources/SourceFactory.h"
 
 #include "host/AsioMainQueue.h"
+#include "platform/TelephonyConstants.h"
+#include "sources/ModemStream.h"
 #include "sources/RecordingSource.h"
 #include "sources/Relay.h"
 #include "sources/SimulatedSource.h"
@@ -29,6 +31,17 @@ OpenSource openSimulation(const SimulationOptions& options) {
     return {std::string(options.technology->identifier), [options]() -> Reader {
                 return std::unique_ptr<PacketSource>(std::make_unique<SimulatedSource>(options));
             }};
+}
+
+Result<OpenSource, HostError> openModem(const LocalModem& modem,
+                                        const SourceSurroundings& surroundings) {
+    auto stream = ModemStream::open(surroundings.queue, modem, surroundings.report);
+    if (!stream) {
+        return stream.error();
+    }
+    return OpenSource{
+        std::string(kHXLogChannelTechnology_IFX),
+        [stream = std::move(stream).value()]() -> Reader { return stream->reader(); }};
 }
 
 Reader takeOnce(std::unique_ptr<PacketSource>& stream, const std::string& name) {
@@ -98,6 +111,9 @@ Result<OpenSource, HostError> openRecording(const Source& source, const std::str
 Result<OpenSource, HostError> openSource(const Source& source, SourceSurroundings surroundings) {
     if (const auto* simulation = std::get_if<SimulationOptions>(&source)) {
         return openSimulation(*simulation);
+    }
+    if (const auto* modem = std::get_if<LocalModem>(&source)) {
+        return openModem(*modem, surroundings);
     }
     if (const auto path = recordingPath(source)) {
         return openRecording(source, *path, std::move(surroundings));

@@ -40,7 +40,8 @@ struct OpenSource {
     std::vector<Descriptor> reading = {};   ///< keep recorders from replacing the recording
 };
 
-/// Opens a source of packets: a recording or a simulated modem. Fails at once if nothing could be
+/// Opens a source of packets: a recording, a simulated modem or a modem of this
+/// machine. Fails at once if nothing could be
 /// read from it, as from the service's modem, whose packets come through the service alone.
 Result<OpenSource, HostError> openSource(const Source& source, SourceSurroundings surroundings);
 

@@ -10,7 +10,7 @@ namespace pallax {
 
 namespace {
 
-using Clock = std::chrono::steady_clock;
+using SteadyClock = std::chrono::steady_clock;
 
 /// Watches the time while another thread waits.
 class Watch {
@@ -55,14 +55,14 @@ private:
 } // namespace
 
 StreamOpening::Opened openStream(const StreamOpening& opening) {
-    const Clock::time_point begun = Clock::now();
+    const SteadyClock::time_point begun = SteadyClock::now();
     Watch watch(opening);
     auto opened = opening.open();
     const bool hasStalled = watch.end();
     if (hasStalled && opened) {
-        opening.report(
-            formatText("The stream continues after %lld s.",
-                       {std::chrono::floor<std::chrono::seconds>(Clock::now() - begun).count()}));
+        opening.report(formatText(
+            "The stream continues after %lld s.",
+            {std::chrono::floor<std::chrono::seconds>(SteadyClock::now() - begun).count()}));
     }
     return opened;
 }

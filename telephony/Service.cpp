@@ -29,11 +29,12 @@ TelephonyServer::Setup serverSetup(const ServiceOptions& options, AsioMainQueue&
     TelephonyServer::Setup setup{queue,        ports,   options.controlPortName, source.makeReader,
                                  options.play, complain};
     setup.technology = source.technology;
-    if (options.relay) {
-        setup.options.speed = PlayOptions::kAsFastAsTaken; // the stream sets the pace
+    const bool isLive = options.relay || pallax::isLive(options.source);
+    if (isLive) {
+        setup.options.speed = PlayOptions::kAsFastAsTaken; // the source sets the pace
         setup.options.live = true;
     }
-    const bool clientSetsPace = std::isinf(options.play.speed) && !options.relay;
+    const bool clientSetsPace = std::isinf(options.play.speed) && !isLive;
     if (!options.lossless && !clientSetsPace) {
         setup.mostWaiting = TelephonyServer::kMostWaiting;
     }
@@ -83,6 +84,9 @@ int serve(const ServiceOptions& options, const std::function<void()>& ready,
     std::unique_ptr<TelephonyServer> server;
     int status = 0;
     SourceSurroundings surroundings{queue, complain};
+    if (options.lossless && isLive(options.source)) {
+        surroundings.report = [](const std::string& /*sentence*/) {}; // its viewer shows it
+    }
     if (options.relay) {
         surroundings.relaying = {options.relayPatience, [&](bool isOrderly) {
                                      status = isOrderly ? 0 : 1;

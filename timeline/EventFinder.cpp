@@ -111,10 +111,11 @@ void EventFinder::look(Row& row, const Moment& moment) {
     }
 }
 
-bool EventFinder::isOvershadowed(const Row& row) const {
-    return std::any_of(_rows.begin(), _rows.end(), [&row](const Row& other) {
+bool EventFinder::isOvershadowed(const Row& row, const Moment& moment) const {
+    return std::any_of(_rows.begin(), _rows.end(), [&](const Row& other) {
         return &other < &row && other.isKnown && other.rule->subject == row.rule->subject &&
-               other.rule->watch == row.rule->watch;
+               other.rule->watch == row.rule->watch &&
+               !textOf(moment.values, other.fields.front()).empty();
     });
 }
 
@@ -136,7 +137,7 @@ void EventFinder::lookAtCell(Row& row, const Moment& moment) {
         row.value = std::move(cell);
         return;
     }
-    if (row.isKnown && !isOvershadowed(row)) {
+    if (row.isKnown && !isOvershadowed(row, moment)) {
         const bool isBack = cell == row.before && timeSince(row, moment) <= _pingPong;
         std::string words(row.rule->subject);
         words.append(" ").append(isSame ? joined(row.value) : row.value.front());

@@ -76,7 +76,7 @@ private:
     /// " after 31 s"; empty if it is unknown.
     static std::string dwell(const Row& row, const Moment& moment);
     void lookAtContexts(Row& row, const Moment& moment);
-    bool isOvershadowed(const Row& row) const;
+    bool isOvershadowed(const Row& row, const Moment& moment) const;
     static void add(const Row& row, EventKind kind, std::string words, const Moment& moment);
 
     std::chrono::nanoseconds _pingPong;

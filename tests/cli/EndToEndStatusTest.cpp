@@ -131,7 +131,8 @@ TEST_F(EndToEndStatus, OfService) {
     ends({{"service", "--status"}, 1, "pallax: No telephony service is running.\n"});
     ends({{"service"},
           2,
-          "pallax: the service needs --play, --simulate, --relay, --status or --list (see pallax "
+          "pallax: the service needs --play, --simulate, --relay, --modem, --status or --list (see "
+          "pallax "
           "service --help)\n"});
     expectEveryDocumentedStatus({"service"});
 }

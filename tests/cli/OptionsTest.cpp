@@ -209,14 +209,14 @@ TEST(Options, ASimulationThatCannotBeIsWrongUsage) {
               "pallax: --seconds requires --simulate (see pallax service --help)\n");
     EXPECT_EQ(sentence({"service", "--relay", "-", "--speed", "2"}),
               "pallax: --speed excludes --relay (see pallax service --help)\n");
-    EXPECT_EQ(
-        sentence({"service", "--play", ""}),
-        "pallax: the service needs --play, --simulate, --relay, --status or --list (see pallax "
-        "service --help)\n");
-    EXPECT_EQ(
-        sentence({"service", "--speed", "2"}),
-        "pallax: the service needs --play, --simulate, --relay, --status or --list (see pallax "
-        "service --help)\n");
+    EXPECT_EQ(sentence({"service", "--play", ""}),
+              "pallax: the service needs --play, --simulate, --relay, --modem, --status or --list "
+              "(see pallax "
+              "service --help)\n");
+    EXPECT_EQ(sentence({"service", "--speed", "2"}),
+              "pallax: the service needs --play, --simulate, --relay, --modem, --status or --list "
+              "(see pallax "
+              "service --help)\n");
 }
 
 TEST(Options, FieldsAreOfEveryTechnologyUnlessOneIsNamed) {
@@ -262,9 +262,9 @@ TEST(Options, EventsAreOfRecordings) {
 }
 
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
-    for (const char* command :
-         {"", "decode", "record", "service", "demo", "simulate", "events", "fields", "explain",
-          "info", "snapshot", "sql", "status", "diff", "watch", "mask", "verify", "completion", "manual"}) {
+    for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "events",
+                                "fields", "explain", "info", "snapshot", "sql", "status", "diff",
+                                "watch", "mask", "verify", "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);
@@ -304,8 +304,8 @@ TEST(Options, WrongUsageIsOneClearSentence) {
               "pallax: --speed: \"0\" is neither a number above 0 nor max (see pallax --help)\n");
     EXPECT_EQ(wrongUsage({"decode"}), "pallax: RECORDING is required (see pallax decode --help)\n");
     EXPECT_EQ(wrongUsage({"service"}),
-              "pallax: the service needs --play, --simulate, --relay, --status or "
-              "--list (see pallax service --help)\n");
+              "pallax: the service needs --play, --simulate, --relay, --modem, --status "
+              "or --list (see pallax service --help)\n");
     EXPECT_EQ(wrongUsage({"a", "decode", "b"}), "pallax: the command \"decode\" must come first, "
                                                 "without options before it (see pallax --help)\n");
     EXPECT_EQ(wrongUsage({"--print", "decode", "b"}),
@@ -407,6 +407,37 @@ TEST(Options, StandardInputCannotBeLooped) {
     EXPECT_EQ(wrongUsage({"service", "--play", "-", "--loop"}),
               "pallax: standard input can be played only once, not with --loop (see pallax service "
               "--help)\n");
+}
+
+LocalModem modemOf(const Source& source) {
+    const auto* modem = std::get_if<LocalModem>(&source);
+    return modem != nullptr ? *modem : LocalModem{"none"};
+}
+
+TEST(Options, AModemIsTheFirstOneOrNamed) {
+    EXPECT_EQ(modemOf(parsed<BrowseOptions>({"modem"}).source).wanted, "auto");
+    EXPECT_EQ(modemOf(parsed<BrowseOptions>({"modem", "AT-9"}).source).wanted, "AT-9");
+    EXPECT_FALSE(modemOf(parsed<BrowseOptions>({"modem"}).source).withIdentities);
+    EXPECT_TRUE(
+        modemOf(parsed<BrowseOptions>({"modem", "--with-identities"}).source).withIdentities);
+    EXPECT_EQ(modemOf(parsed<ServiceOptions>({"service", "--modem"}).source).wanted, "auto");
+    EXPECT_EQ(modemOf(parsed<ServiceOptions>({"service", "--modem", "1"}).source).wanted, "1");
+    EXPECT_EQ(parsed<RecordOptions>({"record", "--modem", "a.pcapng"}).modem->wanted, "auto");
+    EXPECT_EQ(parsed<RecordOptions>({"record", "--modem", "a.pcapng"}).files.path, "a.pcapng");
+    EXPECT_EQ(parsed<RecordOptions>({"record", "--modem", "1", "a.pcapng"}).modem->wanted, "1");
+    EXPECT_EQ(parsed<RecordOptions>({"record", "a.pcapng", "--modem"}).modem->wanted, "auto");
+    EXPECT_FALSE(parsed<RecordOptions>({"record", "a.pcapng"}).modem);
+    (void)parsed<ModemListOptions>({"modem", "--list"});
+    (void)parsed<ModemPolicyOptions>({"modem", "--policy"});
+}
+
+TEST(Options, AModemHasNoOtherSource) {
+    EXPECT_EQ(wrongUsage({"modem", "--list", "--policy"}),
+              "pallax: --list excludes --policy (see pallax modem --help)\n");
+    EXPECT_EQ(wrongUsage({"service", "--with-identities"}),
+              "pallax: --with-identities requires --modem (see pallax service --help)\n");
+    EXPECT_EQ(wrongUsage({"service", "--modem", "--play", "a"}),
+              "pallax: --play excludes --modem (see pallax service --help)\n");
 }
 
 } // namespace

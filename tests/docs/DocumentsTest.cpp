@@ -35,6 +35,9 @@ constexpr auto kNotRun = std::to_array<std::string_view>({
     "systemctl ",
     "build/dev/reference/make_reference",
     "build/dev/tests/",
+    "pallax modem", // they need one
+    "pallax service --modem",
+    "pallax record --modem",
 });
 
 /// Commands that run until the user quits: they get Ctrl-C after two seconds and must succeed.

@@ -122,9 +122,14 @@ TEST(FieldRegistry, KnowsWhichCellAnEntryIs) {
 }
 
 TEST(FieldRegistry, KnowsTheIdentityOfEveryList) {
+    const std::vector<std::string> ofAnySystem{
+        "arfcn", "bsic", "uarfcn", "earfcn", "nr_arfcn", "scrambling_code", "physical_cell_id",
+        "pn"};
     EXPECT_EQ(identitiesIn("ifx"), (Identities{
                                        {"/Barred Cells/*", {"barred_cells"}},
-                                       {"/Neighbour Cells/*", {"arfcn", "bsic"}},
+                                       {"/Data Connections/*", {}},
+                                       {"/Further Serving Cells/*", ofAnySystem},
+                                       {"/Neighbour Cells/*", ofAnySystem},
                                    }));
     EXPECT_EQ(identitiesIn("gsm"),
               (Identities{
@@ -184,6 +189,14 @@ TEST(FieldRegistry, KnowsWhatIdentifiesAPerson) {
                             "gsm.sim_info.ef_iccid",
                             "gsm.sim_info.ef_loci",
                             "gsm.sim_info.ef_msisdn",
+                            "ifx.modem.equipment_id",
+                            "ifx.modem.esn",
+                            "ifx.modem.imei",
+                            "ifx.modem.meid",
+                            "ifx.modem.own_number",
+                            "ifx.sim.eid",
+                            "ifx.sim.iccid",
+                            "ifx.sim.imsi",
                             "lte.pdp_context_info",
                             "lte.sim_info.ef_3gpp_mail_box_dialing_number",
                             "lte.sim_info.ef_access_control_class",

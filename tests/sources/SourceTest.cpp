@@ -41,6 +41,8 @@ TEST(Source, HasANameForMessages) {
     EXPECT_EQ(sourceName(StreamedRecording{"/dev/fd/63"}), "/dev/fd/63");
     EXPECT_EQ(sourceName(StreamedRecording{"-", "pipe"}), "pipe");
     EXPECT_EQ(sourceName(drive("cdma")), "simulated cdma");
+    EXPECT_EQ(sourceName(LocalModem{"auto"}), "modem");
+    EXPECT_EQ(sourceName(LocalModem{"AT-9"}), "modem AT-9");
 }
 
 TEST(Source, OnlyAStreamIsReadOnce) {
@@ -48,6 +50,12 @@ TEST(Source, OnlyAStreamIsReadOnce) {
     EXPECT_FALSE(isReadOnce(FileRecording{"a"}));
     EXPECT_FALSE(isReadOnce(ServiceModem()));
     EXPECT_FALSE(isReadOnce(drive("lte")));
+}
+
+TEST(Source, OnlyAModemOfThisMachineIsLive) {
+    EXPECT_TRUE(isLive(LocalModem{"auto"}));
+    EXPECT_FALSE(isLive(StreamedRecording{"-"}));
+    EXPECT_FALSE(isLive(drive("lte")));
 }
 
 TEST(Source, NumberedPartsAreOneRecording) {
@@ -69,6 +77,9 @@ TEST(Source, IsWrittenAsArguments) {
     EXPECT_EQ(argumentsOf(FileRecording{"a b"}), (Arguments{"file", "a b"}));
     EXPECT_EQ(argumentsOf(FileRecording{"a", {"b", "c"}}), (Arguments{"file", "a", "b", "c"}));
     EXPECT_EQ(argumentsOf(StreamedRecording{"-", "pipe"}), (Arguments{"stream", "-", "pipe"}));
+    EXPECT_EQ(argumentsOf(LocalModem{"AT-9"}), (Arguments{"modem", "AT-9", ""}));
+    EXPECT_EQ(argumentsOf(LocalModem{"AT-9", true}),
+              (Arguments{"modem", "AT-9", "with-identities"}));
     SimulationOptions options = drive("utran");
     EXPECT_EQ(argumentsOf(options), (Arguments{"simulated", "utran", "1", "40"}));
     options.seed = 18446744073709551615U;
@@ -81,7 +92,7 @@ TEST(Source, IsWrittenAsArguments) {
 TEST(Source, IsReadFromItsArguments) {
     EXPECT_TRUE(doubles::holds([] {
         Source source;
-        switch (doubles::any::between(0, 4)) {
+        switch (doubles::any::between(0, 5)) {
         case 0:
             break;
         case 1:
@@ -92,6 +103,9 @@ TEST(Source, IsReadFromItsArguments) {
             break;
         case 2:
             source = StreamedRecording{doubles::any::text(), doubles::any::text()};
+            break;
+        case 3:
+            source = LocalModem{doubles::any::text(), doubles::any::boolean()};
             break;
         default:
             SimulationOptions options;
