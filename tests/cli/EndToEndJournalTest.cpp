@@ -15,10 +15,12 @@ protected:
         "select count(*), min(packet), sum(length) from packet union all "
         "select count(*), min(packet), sum(number) from sample";
 
-    /// A drive of 20,000 packets and about 2.5 MiB.
-    std::string drive() const {
+    /// A drive of 1,000 packets and about 130 KiB for each second of its length.
+    std::string drive(int length) const {
         const std::string path = world.path("drive.pcap");
-        EXPECT_EQ(run({"simulate", "lte", "--rate", "1000", "--seconds", "20", "-o", path}).status,
+        EXPECT_EQ(run({"simulate", "lte", "--rate", "1000", "--seconds", std::to_string(length),
+                       "-o", path})
+                      .status,
                   0);
         return path;
     }
@@ -35,7 +37,7 @@ protected:
 };
 
 TEST_F(EndToEndJournal, APipeAndACompressedRecordingAnswerLikeTheFile) {
-    const std::string path = drive();
+    const std::string path = drive(5);
     const Run plain = run({"sql", path, kQuery});
     EXPECT_EQ(plain.status, 0) << plain.err;
     for (const Run& other :
@@ -49,7 +51,7 @@ TEST_F(EndToEndJournal, APipeAndACompressedRecordingAnswerLikeTheFile) {
 
 TEST_F(EndToEndJournal, OfMoreThanTheSettingsAllowTheLatestPacketsAnswer) {
     writeSettings("journal-mebibytes = 1\njournal-hours = 1\n");
-    const Run run = this->run({"sql", compressed(drive()), "select max(packet) from packet"});
+    const Run run = this->run({"sql", compressed(drive(20)), "select max(packet) from packet"});
     EXPECT_EQ(run.status, 1);
     EXPECT_NE(run.out.find("20000"), std::string::npos) << run.out;
     EXPECT_TRUE(run.err.ends_with(" were dropped to keep at most 1 MiB (journal-mebibytes).\n"))

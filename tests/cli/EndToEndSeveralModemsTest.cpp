@@ -100,6 +100,7 @@ TEST_F(EndToEndSeveralModems, OneServiceCanEndAndComeBackWhileTheOtherGoesOn) {
     gsm = start("car2", "gsm");
     EXPECT_TRUE(terminal.showsNoMore("connecting: no service"));
     EXPECT_TRUE(terminal.shows("values from before "));
+    terminal.type("o");
     quit(terminal);
 }
 

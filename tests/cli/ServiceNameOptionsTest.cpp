@@ -25,7 +25,7 @@ TEST(Options, AServiceCanHaveAName) {
         EXPECT_EQ(ended(arguments).status, kExitWrongUsage) << further.front();
     }
     EXPECT_EQ(ended({"service", "--name", "car1"}).text,
-              "pallax: the service needs --play, --simulate, --relay, --status or --list (see "
+              "pallax: the service needs --play, --simulate, --relay, --modem, --status or --list (see "
               "pallax service --help)\n");
 }
 
