@@ -102,9 +102,9 @@ void FrontEnd::openEvents() {
 }
 
 void FrontEnd::openQuery() {
-    _pages.open(
-        QueryPage({_surroundings.moment, _surroundings.goTo, _surroundings.mayGoOn,
-                   _surroundings.queries, [this](const std::string& text) { copy(text); }}));
+    _pages.open(QueryPage({_surroundings.moment, _surroundings.goTo, _surroundings.mayGoOn,
+                           _surroundings.queries, _surroundings.ahead, _marks,
+                           [this](const std::string& text) { copy(text); }}));
     needsDisplay();
 }
 
