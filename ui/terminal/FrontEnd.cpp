@@ -21,6 +21,10 @@ FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
              [this] { needsDisplay(); }}),
       _shown(_surroundings.valueSource()), _finder(finderSurroundings()) {
     _toolkit.lists().partAt = _surroundings.entryPart;
+    _toolkit.lists().ageAt = [this](const std::string& path) {
+        _shown.update();
+        return _shown.ageAt(path);
+    };
 }
 
 /// Click areas may be out of date until the next drawing.
