@@ -6,6 +6,8 @@
 
 #include <algorithm>
 #include <fstream>
+#include <functional>
+#include <string_view>
 #include <utility>
 
 namespace pallax {
@@ -19,6 +21,11 @@ std::uint64_t pcapNgSize(std::size_t length) {
     constexpr std::uint64_t kBlock = 32;
     constexpr std::uint64_t kWord = 4;
     return kBlock + (length + kWord - 1) / kWord * kWord;
+}
+
+std::size_t digestOf(Bytes data) {
+    return std::hash<std::string_view>()(
+        {reinterpret_cast<const char*>(data.data()), data.size()}); // NOLINT: bytes as characters
 }
 
 } // namespace
@@ -42,7 +49,7 @@ public:
 private:
     void start() {
         _recording.reset();
-        if (!_journal._watch.isSameFile()) {
+        if (!_journal._watch.isSameFile() || _journal.isRewritten()) {
             return;
         }
         auto opened = Recording::open(_journal._path);
@@ -52,7 +59,6 @@ private:
         }
         _recording = std::move(opened).value();
         _next = 1;
-        _expected.reset();
         const auto& places = _journal._places;
         const std::uint64_t from = std::max(_from, _continueAt);
         const auto after = std::upper_bound(
@@ -62,7 +68,6 @@ private:
             const Place& place = *std::prev(after);
             if (_recording->seek(place.position)) {
                 _next = place.packet;
-                _expected = place;
             }
         }
         _position = _recording->position().value_or(0);
@@ -85,16 +90,26 @@ private:
             stop();
             return std::nullopt;
         }
-        if (_expected &&
-            (packet->time != _expected->time || packet->data.size() != _expected->length)) {
+        if (isOther(*packet)) {
             _journal._hasChanged = true;
             stop();
             return std::nullopt;
         }
-        _expected.reset();
         const std::uint64_t number = _next++;
         account(*packet, number);
         return JournalPacket{number, packet->time, packet->data};
+    }
+
+    /// Whether another packet was at this place before.
+    bool isOther(const RecordedPacket& packet) const {
+        const std::uint64_t place = (_next - 1) / kPlacesEvery;
+        const auto& places = _journal._places;
+        if (_next % kPlacesEvery != 1 || place >= places.size()) {
+            return false;
+        }
+        const Place& noted = places[place];
+        return packet.time != noted.time || packet.data.size() != noted.length ||
+               digestOf(packet.data) != noted.digest;
     }
 
     /// Notes the place of every 4096th packet. Where something else than packets lies between two
@@ -113,7 +128,8 @@ private:
         if (_journal._places.empty() || _journal._places.back().packet < number) {
             _journal._canSeek = _journal._canSeek && (number == 1 || isPcap || isPcapNg);
             const std::uint64_t size = isPcap ? kPcapHeader + length : pcapNgSize(length);
-            _journal._places.push_back({number, end - size, packet.time, length});
+            _journal._places.push_back(
+                {number, end - size, packet.time, length, digestOf(packet.data)});
             _journal._read = end;
         }
         _position = end;
@@ -142,7 +158,6 @@ private:
     std::uint64_t _position = 0; // in the file, where the reader began or last looked
     std::uint64_t _asPcap = 0;   // what the packets since take, in each form
     std::uint64_t _asPcapNg = 0;
-    std::optional<Place> _expected; // the packet after a seek
 };
 
 bool RecordingJournal::isSuitable(const std::string& path) {
@@ -167,6 +182,10 @@ RecordingJournal::open(const std::string& path) {
 
 std::unique_ptr<PacketReader> RecordingJournal::reader(std::uint64_t from) {
     return std::make_unique<Reader>(*this, from);
+}
+
+bool RecordingJournal::isRewritten() const {
+    return _hasChanged || sizeOfFile(_path) < std::max({_watch.size(), _read, _sizeAtEnd});
 }
 
 std::optional<std::string> RecordingJournal::trouble() const {

@@ -41,8 +41,12 @@ private:
         std::uint64_t position;
         Time time;
         std::size_t length;
+        std::size_t digest; ///< of its bytes
     };
     static constexpr std::uint64_t kPlacesEvery = 4096; // packets
+
+    /// Whether the file is shorter than it was, or has other packets where it was read.
+    bool isRewritten() const;
 
     explicit RecordingJournal(const std::string& path) : _path(path), _watch(path) {}
 

@@ -2,6 +2,7 @@
 
 #include "LogGenerator/Records/SampleValue.h"
 #include "app/pane/PaneRow.h"
+#include "text/AgeText.h"
 
 #include <algorithm>
 #include <utility>
@@ -178,6 +179,34 @@ bool isTable(const PallaxModelNode& node) {
 TableContent tableOf(const PallaxModelNode& list, const std::string& path,
                      const EntryPartAt& partAt) {
     return ListReader(path, partAt).read(*list.childNodes());
+}
+
+std::vector<TableCell> agesOf(const PallaxModelNode& list, const std::string& path,
+                              const LeafAgeAt& ageAt) {
+    std::vector<TableCell> ages;
+    for (const NodeRef& entry : *list.childNodes()) {
+        const std::string place = childPath(path, entry->displayName());
+        std::optional<std::chrono::nanoseconds> latest;
+        for (const NodeRef& leaf : *entry->childNodes()) {
+            const auto age = ageAt(childPath(place, leaf->displayName()));
+            latest = age && (!latest || *age < *latest) ? age : latest;
+        }
+        ages.push_back(latest ? TableCell{ageText(*latest), static_cast<double>(latest->count())}
+                              : TableCell());
+    }
+    return ages;
+}
+
+void addAges(TableContent& table, const std::vector<TableCell>& ages) {
+    const bool isKnown = std::any_of(ages.begin(), ages.end(),
+                                     [](const TableCell& age) { return age.number.has_value(); });
+    if (!isKnown) {
+        return;
+    }
+    table.columns.push_back({"age", {}, false, true});
+    for (std::size_t row = 0; row < ages.size(); ++row) {
+        table.rows[row].cells.push_back(ages[row]);
+    }
 }
 
 } // namespace pallax

@@ -19,6 +19,9 @@ struct TableColumn {
     std::string name;
     std::string unit = {};   ///< of all its numbers, or empty
     bool isIdentity = false; ///< tells the rows apart; identity columns come first
+    /// About the row and not of it: shown while it is chosen or all columns are, and neither
+    /// searched, copied with the row nor marked as changed.
+    bool isExtra = false;
 };
 
 struct TableRow {

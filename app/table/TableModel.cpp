@@ -39,6 +39,7 @@ void TableModel::show(TableContent content) {
     _chosenName.reset();
     _isDescending = false;
     _hiddenNames.clear();
+    _showsExtra = false;
     resolveColumns();
     arrange();
     rememberCursor();
@@ -76,7 +77,8 @@ void TableModel::markChanges(const TableContent& before) {
             const TableCell* cell =
                 same != nullptr && columns[column] ? &same->cells[*columns[column]] : nullptr;
             const std::string& text = row.cells[column].text;
-            _changed.push_back(!text.empty() && (cell == nullptr || cell->text != text));
+            _changed.push_back(!text.empty() && !_content.columns[column].isExtra &&
+                               (cell == nullptr || cell->text != text));
         }
         if (same != nullptr) {
             rows.erase(found);
@@ -94,10 +96,12 @@ void TableModel::setFilter(std::string text) {
 }
 
 bool TableModel::passes(const TableRow& row) const {
-    return _filter.empty() ||
-           std::any_of(row.cells.begin(), row.cells.end(), [this](const TableCell& cell) {
-               return findIgnoringCase(cell.text, _filter) != std::string_view::npos;
-           });
+    bool passes = _filter.empty();
+    for (std::size_t column = 0; !passes && column < row.cells.size(); ++column) {
+        passes = !_content.columns[column].isExtra &&
+                 findIgnoringCase(row.cells[column].text, _filter) != std::string_view::npos;
+    }
+    return passes;
 }
 
 void TableModel::arrange() {
@@ -156,20 +160,35 @@ bool TableModel::isHidden(std::size_t column) const {
            _hiddenNames.end();
 }
 
-std::vector<std::size_t> TableModel::columns() const {
-    std::vector<std::size_t> visible;
+std::vector<std::size_t> TableModel::choices() const {
+    std::vector<std::size_t> all;
     for (std::size_t column = 0; column < _content.columns.size(); ++column) {
         if (!isHidden(column)) {
-            visible.push_back(column);
+            all.push_back(column);
         }
     }
+    return all;
+}
+
+std::vector<std::size_t> TableModel::columns() const {
+    std::vector<std::size_t> visible = choices();
+    std::erase_if(visible, [this](std::size_t column) {
+        return _content.columns[column].isExtra && !_showsExtra && column != _chosen;
+    });
     return visible;
 }
 
+void TableModel::setCells(std::size_t column, std::vector<TableCell> cells) {
+    for (std::size_t row = 0; row < _content.rows.size(); ++row) {
+        _content.rows[row].cells[column] = std::move(cells[row]);
+    }
+    ++_version;
+    arrange();
+}
+
 std::size_t TableModel::placeOf(std::size_t column) const {
-    const std::vector<std::size_t> visible = columns();
-    return static_cast<std::size_t>(std::find(visible.begin(), visible.end(), column) -
-                                    visible.begin());
+    const std::vector<std::size_t> all = choices();
+    return static_cast<std::size_t>(std::find(all.begin(), all.end(), column) - all.begin());
 }
 
 void TableModel::choose(std::size_t column) {
@@ -179,10 +198,10 @@ void TableModel::choose(std::size_t column) {
 }
 
 void TableModel::chooseNext() {
-    const std::vector<std::size_t> visible = columns();
+    const std::vector<std::size_t> all = choices();
     const std::size_t next = _chosen ? placeOf(*_chosen) + 1 : 0;
-    if (next < visible.size()) {
-        choose(visible[next]);
+    if (next < all.size()) {
+        choose(all[next]);
     }
 }
 
@@ -191,7 +210,7 @@ void TableModel::choosePrevious() {
         return;
     }
     if (const std::size_t place = placeOf(*_chosen); place > 0) {
-        choose(columns()[place - 1]);
+        choose(choices()[place - 1]);
         return;
     }
     _chosen.reset();
@@ -210,7 +229,7 @@ void TableModel::hideChosen() {
     }
     const std::size_t place = placeOf(*_chosen);
     _hiddenNames.push_back(*_chosenName);
-    const std::vector<std::size_t> visible = columns();
+    const std::vector<std::size_t> visible = choices();
     if (!visible.empty()) { // several columns may have had this name
         choose(visible[std::min(place, visible.size() - 1)]);
     }
@@ -218,6 +237,7 @@ void TableModel::hideChosen() {
 
 void TableModel::showAllColumns() {
     _hiddenNames.clear();
+    _showsExtra = true;
 }
 
 std::optional<std::string> TableModel::copied() const {
@@ -231,7 +251,8 @@ std::optional<std::string> TableModel::copied() const {
     bool hasValue = false;
     for (std::size_t column = 0; column < columns.size(); ++column) {
         const TableCell& cell = _content.rows[*row].cells[column];
-        if (_chosen ? column == *_chosen : columns[column].isIdentity || !hasIdentity) {
+        if (_chosen ? column == *_chosen
+                    : columns[column].isIdentity || (!hasIdentity && !columns[column].isExtra)) {
             const char* const between = hasIdentity ? " " : "\t";
             text.append(text.empty() ? "" : between).append(withUnit(cell, columns[column]));
             hasValue = hasValue || !cell.text.empty();

@@ -47,7 +47,10 @@ public:
     /// Moves the cursor to a row of the content, if it is shown.
     void select(std::size_t row);
 
-    /// The columns that are not hidden.
+    /// Replaces the cells of a column, by row. Nothing is marked as changed.
+    void setCells(std::size_t column, std::vector<TableCell> cells);
+
+    /// The columns that are not hidden, and of the extra ones those that are shown.
     std::vector<std::size_t> columns() const;
     bool hidesColumns() const { return !_hiddenNames.empty(); }
     /// The column by which the rows are sorted; nothing: the rows are in the order of the content.
@@ -68,8 +71,10 @@ public:
 
 private:
     bool isHidden(std::size_t column) const;
+    /// Those that are not hidden, extra ones included.
+    std::vector<std::size_t> choices() const;
     bool passes(const TableRow& row) const;
-    /// The position of a column among those that are not hidden.
+    /// The position of a column among the choices.
     std::size_t placeOf(std::size_t column) const;
     void markChanges(const TableContent& before);
     void resolveColumns();
@@ -89,6 +94,7 @@ private:
     std::optional<std::string> _chosenName; ///< a chosen column may vanish and return
     bool _isDescending = false;
     std::vector<std::string> _hiddenNames;
+    bool _showsExtra = false;
 };
 
 } // namespace pallax

@@ -28,8 +28,11 @@ void ChangesPage::draw(const PageScreen& screen, const PageSurroundings& around)
         const std::string text =
             eventWords(content.lines[static_cast<std::size_t>(line)], screen.marks);
         const bool isTitle = !text.starts_with(' ');
-        screen.grid.put(kMargin, kRowsAbove + line - _scrolling.first(), text, {.bold = isTitle},
-                        frame.span());
+        const int y = kRowsAbove + line - _scrolling.first();
+        const Span span = frame.span();
+        if (screen.grid.put(kMargin, y, text, {.bold = isTitle}, span) > span.right) {
+            screen.grid.put(span.right - 1, y, screen.marks.more, {.dim = true});
+        }
     }
     if (lines == 0) {
         screen.grid.put(kMargin, kRowsAbove, kNothingDiffers, {}, frame.span());

@@ -21,6 +21,10 @@ FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
              [this] { needsDisplay(); }}),
       _shown(_surroundings.valueSource()), _finder(finderSurroundings()) {
     _toolkit.lists().partAt = _surroundings.entryPart;
+    _toolkit.lists().ageAt = [this](const std::string& path) {
+        _shown.update();
+        return _shown.ageAt(path);
+    };
 }
 
 /// Click areas may be out of date until the next drawing.
@@ -102,9 +106,9 @@ void FrontEnd::openEvents() {
 }
 
 void FrontEnd::openQuery() {
-    _pages.open(
-        QueryPage({_surroundings.moment, _surroundings.goTo, _surroundings.mayGoOn,
-                   _surroundings.queries, [this](const std::string& text) { copy(text); }}));
+    _pages.open(QueryPage({_surroundings.moment, _surroundings.goTo, _surroundings.mayGoOn,
+                           _surroundings.queries, _surroundings.ahead, _marks,
+                           [this](const std::string& text) { copy(text); }}));
     needsDisplay();
 }
 

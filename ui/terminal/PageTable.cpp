@@ -104,7 +104,9 @@ void PageTable::drawTitle(const PageScreen& screen, Bars& bars, std::string_view
     }
     const std::string path = std::string(root).append(screen.marks.crumb).append(title);
     const int room = bars.drawOrigin(right, right - kMargin - columnsOf(path) - kGap);
-    screen.grid.put(kMargin, kTitleRow, path, {.bold = true}, {kMargin, room});
+    if (screen.grid.put(kMargin, kTitleRow, path, {.bold = true}, {kMargin, room}) > room) {
+        screen.grid.put(room - 1, kTitleRow, screen.marks.more, {.dim = true});
+    }
 }
 
 void PageTable::drawLastRow(const PageScreen& screen, const PageSurroundings& around, Bars& bars,

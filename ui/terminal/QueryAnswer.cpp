@@ -4,7 +4,9 @@
 #include "query/QueryErrorText.h"
 #include "query/TimelineTables.h"
 #include "timeline/Timeline.h"
+#include "ui/terminal/EventText.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <system_error>
@@ -65,6 +67,9 @@ void readRows(Query& query, QueryAnswer& answer) {
     }
 }
 
+/// The column with times, in microseconds.
+constexpr std::string_view kTime = "time";
+
 /// The whole number in the column of that name.
 std::optional<std::int64_t> numberIn(const TableContent& table, std::size_t row,
                                      std::string_view name) {
@@ -78,6 +83,16 @@ std::optional<std::int64_t> numberIn(const TableContent& table, std::size_t row,
         }
     }
     return std::nullopt;
+}
+
+std::optional<Time> timeIn(const TableContent& table, std::size_t row) {
+    constexpr std::int64_t kLatest =
+        std::chrono::duration_cast<std::chrono::microseconds>(kLatestTime.time_since_epoch())
+            .count();
+    const auto time = numberIn(table, row, kTime);
+    return time && *time >= 0 && *time <= kLatest
+               ? std::optional(Time(std::chrono::microseconds(*time)))
+               : std::nullopt;
 }
 
 } // namespace
@@ -101,6 +116,28 @@ QueryAnswer answerQuery(Timeline& timeline, const std::string& query,
     return answer;
 }
 
+void addTimeOfDay(TableContent& table, std::chrono::seconds ahead) {
+    auto& columns = table.columns;
+    const auto found = std::find_if(columns.begin(), columns.end(),
+                                    [](const auto& column) { return column.name == kTime; });
+    std::vector<std::optional<Time>> times;
+    for (std::size_t row = 0; row < table.rows.size(); ++row) {
+        times.push_back(timeIn(table, row));
+    }
+    const bool hasTimes =
+        std::any_of(times.begin(), times.end(), [](const auto& time) { return time.has_value(); });
+    if (found == columns.end() || !hasTimes) {
+        return;
+    }
+    const auto place = found - columns.begin() + 1;
+    columns.insert(columns.begin() + place, {"clock"});
+    for (std::size_t row = 0; row < times.size(); ++row) {
+        auto& cells = table.rows[row].cells;
+        cells.insert(cells.begin() + place,
+                     {times[row] ? eventTime(*times[row], ahead) : std::string()});
+    }
+}
+
 std::optional<std::uint64_t> packetOf(const TableContent& table, std::size_t row,
                                       const Timeline& timeline) {
     if (const auto packet = numberIn(table, row, "packet")) {
@@ -108,17 +145,14 @@ std::optional<std::uint64_t> packetOf(const TableContent& table, std::size_t row
         const bool isThere = number >= timeline.firstInstant() && number <= timeline.packets();
         return isThere ? std::optional(number) : std::nullopt;
     }
-    const auto time = numberIn(table, row, "time");
-    constexpr std::int64_t kLatest =
-        std::chrono::duration_cast<std::chrono::microseconds>(kLatestTime.time_since_epoch())
-            .count();
-    if (!time || *time < 0 || *time > kLatest) {
+    const auto time = timeIn(table, row);
+    if (!time) {
         return std::nullopt;
     }
     // The column is truncated, and its packet belongs to the instant.
     constexpr std::chrono::nanoseconds kRest =
         std::chrono::microseconds(1) - std::chrono::nanoseconds(1);
-    return timeline.instantAt(Time(std::chrono::microseconds(*time)) + kRest);
+    return timeline.instantAt(*time + kRest);
 }
 
 } // namespace pallax::terminal

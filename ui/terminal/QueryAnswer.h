@@ -2,6 +2,7 @@
 
 #include "app/table/TableContent.h"
 
+#include <chrono>
 #include <cstddef>
 #include <cstdint>
 #include <functional>
@@ -31,6 +32,10 @@ struct QueryAnswer {
 QueryAnswer answerQuery(Timeline& timeline, const std::string& query,
                         const std::function<bool()>& mayGoOn,
                         const std::function<void(Database&, Timeline&)>& addFunctions);
+
+/// Adds a column `clock` with the time of day after a column `time` of microseconds. Local time is
+/// so much ahead of UTC.
+void addTimeOfDay(TableContent& table, std::chrono::seconds ahead);
 
 /// The packet of a row: the number in its column `packet`, or the latest packet at the time in its
 /// column `time`. Nothing if it has neither.

@@ -1,5 +1,6 @@
 #include "ui/terminal/QueryPage.h"
 
+#include "ui/terminal/EventText.h"
 #include "ui/terminal/Prompt.h"
 
 #include <utility>
@@ -94,6 +95,12 @@ void QueryPage::run(const std::string& query) {
         answer = answerQuery(*moment.timeline, query, _surroundings.mayGoOn,
                              _surroundings.seams.addFunctions);
         _isRunning = false;
+        addTimeOfDay(answer.table, _surroundings.ahead());
+        for (TableRow& row : answer.table.rows) {
+            for (TableCell& cell : row.cells) { // the words of events have an arrow
+                cell.text = eventWords(std::move(cell.text), _surroundings.marks);
+            }
+        }
     }
     _sentence = std::move(answer.sentence);
     _hasAnswer = !answer.hasFailed;

@@ -4,6 +4,7 @@
 #include "ui/terminal/PageTable.h"
 #include "ui/terminal/QueryAnswer.h"
 
+#include <chrono>
 #include <cstddef>
 #include <cstdint>
 #include <functional>
@@ -31,6 +32,8 @@ public:
         /// Asked often during a query; false stops it.
         std::function<bool()> mayGoOn;
         QuerySeams seams;
+        std::function<std::chrono::seconds()> ahead; ///< local time minus UTC
+        const Marks& marks;
         PageTable::Copy copy;
     };
 

@@ -101,7 +101,9 @@ bool FrontEnd::findAgain(const KeyEvent& event) {
 
 /// After the last row comes the first.
 void FrontEnd::findRowAgain(bool isForward) {
-    const std::vector<FoundRow> rows = _finder.rows(_search->text);
+    std::vector<FoundRow> rows = _finder.rows(_search->text);
+    const bool isCut = rows.size() > TextFinder::kMostHits;
+    rows.resize(std::min(rows.size(), TextFinder::kMostHits));
     if (rows.empty()) {
         return setMessage("Nothing in this frame contains " + _search->text + ".");
     }
@@ -118,7 +120,7 @@ void FrontEnd::findRowAgain(bool isForward) {
     }
     goToPlace(rows[index].place);
     setMessage(_search->text + ": " + std::to_string(index + 1) + " of " +
-               std::to_string(rows.size()));
+               std::to_string(rows.size()) + (isCut ? " (there are more)" : ""));
 }
 
 void FrontEnd::findInstantAgain(bool isForward) {

@@ -45,6 +45,14 @@ void ShownValues::update() {
     }
 }
 
+std::optional<std::chrono::nanoseconds> ShownValues::ageAt(std::string_view path) const {
+    const auto leaf = _values != nullptr ? leafAt(*_values, path) : std::nullopt;
+    const auto value = leaf ? valueOf(*_values, *leaf) : std::nullopt;
+    return value ? std::optional<std::chrono::nanoseconds>(
+                       std::max<std::chrono::nanoseconds>(_time.now - value->value.read, {}))
+                 : std::nullopt;
+}
+
 const Reading* ShownValues::reading(const LeafName& leaf, const LeafValue& value) {
     if (_moment.timeline == nullptr) {
         return nullptr;

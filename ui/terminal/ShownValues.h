@@ -13,6 +13,7 @@
 #include <map>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace pallax::terminal {
@@ -53,6 +54,8 @@ public:
     const QualityProfile& profile() const { return _source.profile(); }
     const DisplayTime& time() const { return _time; }
 
+    /// How long ago the value at a path of the display was read; nothing if there is none.
+    std::optional<std::chrono::nanoseconds> ageAt(std::string_view path) const;
     /// The last reading of a value; null without a timeline.
     const Reading* reading(const LeafName& leaf, const LeafValue& value);
     /// The window of this length, or of all time. Curves and events are those of the window that

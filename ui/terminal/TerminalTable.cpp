@@ -53,13 +53,26 @@ void TerminalTable::refreshList() {
     }
     const bool isFollowed = _listed != nullptr;
     TableModel& model = _list.model();
-    model.update(isListWithColumns() ? tableOf(*node, pane().path(), _look->partAt)
-                                     : TableContent(),
+    TableContent content;
+    if (isListWithColumns()) {
+        content = tableOf(*node, pane().path(), _look->partAt);
+        addAges(content, agesOf(*node, pane().path(), _look->ageAt));
+    }
+    model.update(std::move(content),
                  isFollowed ? TableModel::Changes::Mark : TableModel::Changes::Ignore);
     if (const auto row = pane().cursorRow(); row && !isFollowed) {
         model.select(*row);
     }
     _listed = node;
+}
+
+void TerminalTable::refreshAges() {
+    TableModel& model = _list.model();
+    for (const std::size_t column : model.columns()) {
+        if (model.content().columns[column].isExtra) {
+            model.setCells(column, agesOf(*_listed, pane().path(), _look->ageAt));
+        }
+    }
 }
 
 bool TerminalTable::isListWithColumns() const {
@@ -71,6 +84,7 @@ ColumnTable* TerminalTable::list() {
         return nullptr;
     }
     refreshList();
+    refreshAges();
     return &_list;
 }
 

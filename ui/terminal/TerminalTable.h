@@ -17,6 +17,7 @@ namespace pallax::terminal {
 struct ListLook {
     bool asTables = false; ///< instead of rows that open
     EntryPartAt partAt = [](const std::string& /*path*/) { return EntryPart::None; };
+    LeafAgeAt ageAt = [](const std::string& /*path*/) { return std::nullopt; };
 };
 
 /// A table of which a terminal shows a window of rows. Its source owns a pane, which knows the
@@ -91,6 +92,8 @@ private:
     void keepCursorInWindow();
     /// Fills the table with columns again if the pane has new data.
     void refreshList();
+    /// Ages grow while nothing arrives.
+    void refreshAges();
     void switchLook();
 
     ui::TableSource& _source;

@@ -48,6 +48,26 @@ TEST(ListTableTest, AListOfBranchesIsATable) {
     EXPECT_FALSE(isTable(*leafNode("A", "1")));
 }
 
+TEST(ListTableTest, AnEntryIsAsOldAsItsLatestValue) {
+    using namespace std::chrono_literals;
+    const NodeRef list = nodeOf(
+        Array{Dictionary{{"A", "1"}, {"B", "2"}}, Dictionary{{"A", "3"}}, Dictionary{{"A", "4"}}});
+    const LeafAgeAt ageAt = [](const std::string& path) -> std::optional<std::chrono::nanoseconds> {
+        return path == "/List/0/A"   ? std::optional(200s)
+               : path == "/List/0/B" ? std::optional(14s)
+               : path == "/List/2/A" ? std::optional(180s)
+                                     : std::nullopt;
+    };
+    TableContent table = tableOf(*list, "/List", noPart);
+    addAges(table, agesOf(*list, "/List", ageAt));
+    EXPECT_EQ(textOf(table), "A|B|age|\n1#|2#|14 s#|\n3#|||\n4#||3 min#|");
+    EXPECT_TRUE(table.columns.back().isExtra);
+    EXPECT_FALSE(table.columns.front().isExtra);
+    TableContent unknown = tableOf(*list, "/List", noPart);
+    addAges(unknown, agesOf(*list, "/List", [](const std::string&) { return std::nullopt; }));
+    EXPECT_EQ(textOf(unknown), "A|B|\n1#|2#|\n3#||\n4#||");
+}
+
 TEST(ListTableTest, AColumnForEachFieldInTheOrderOfTheDisplay) {
     EXPECT_EQ(tableText(Array{Dictionary{{"A", "x"}, {"C", "y"}},
                               Dictionary{{"A", "1"}, {"B", "2"}, {"C", "z"}, {"D", "4"}},

@@ -130,6 +130,61 @@ TEST_F(TableModelTest, HidesTheChosenColumnAndChoosesItsNeighbour) {
     EXPECT_EQ(model.columns(), (std::vector<std::size_t>{0, 1, 2}));
 }
 
+/// The cells with an extra column.
+TableContent agedCells(const char* firstAge = "4 s") {
+    TableContent content = cells();
+    content.columns.push_back({"age", "", false, true});
+    content.rows[0].cells.push_back(number(4, firstAge));
+    content.rows[1].cells.push_back(number(1, "1 s"));
+    content.rows[2].cells.push_back(number(180, "3 min"));
+    return content;
+}
+
+TEST_F(TableModelTest, AnExtraColumnIsShownWhileItIsChosen) {
+    model.show(agedCells());
+    EXPECT_EQ(model.columns(), (std::vector<std::size_t>{0, 1, 2}));
+    model.choose(2);
+    model.chooseNext();
+    EXPECT_EQ(model.chosenColumn(), 3U);
+    EXPECT_EQ(model.columns(), (std::vector<std::size_t>{0, 1, 2, 3}));
+    EXPECT_EQ(keys(), "184 252 9 ");
+    EXPECT_EQ(model.copied(), "4 s") << "the cursor has kept to its row";
+    model.reverse();
+    EXPECT_EQ(keys(), "9 252 184 ");
+    model.choosePrevious();
+    EXPECT_EQ(model.chosenColumn(), 2U);
+    EXPECT_EQ(model.columns(), (std::vector<std::size_t>{0, 1, 2}));
+    model.showAllColumns();
+    EXPECT_EQ(model.columns(), (std::vector<std::size_t>{0, 1, 2, 3}));
+    model.show(agedCells());
+    EXPECT_EQ(model.columns(), (std::vector<std::size_t>{0, 1, 2}));
+}
+
+TEST_F(TableModelTest, AnExtraColumnIsNeitherSearchedNorMarkedNorCopiedWithItsRow) {
+    model.show(agedCells());
+    model.setFilter("3 min");
+    EXPECT_EQ(keys(), "");
+    model.setFilter("");
+    model.update(agedCells("6 s"), Changes::Mark);
+    EXPECT_EQ(changes(), "---- ---- ---- ");
+    TableContent content = agedCells();
+    content.columns[0].isIdentity = false;
+    model.show(content);
+    EXPECT_EQ(model.copied(), "252\t-91 dBm\tcamped");
+}
+
+TEST_F(TableModelTest, TheCellsOfAColumnCanBeReplaced) {
+    model.show(agedCells());
+    model.choose(3);
+    model.moveCursorTo(0);
+    EXPECT_EQ(cursorKey(), "184");
+    const std::uint64_t version = model.version();
+    model.setCells(3, {number(1, "1 s"), number(5, "5 s"), number(200, "3 min")});
+    EXPECT_EQ(keys(), "252 184 9 ");
+    EXPECT_EQ(cursorKey(), "184");
+    EXPECT_NE(model.version(), version);
+}
+
 TEST_F(TableModelTest, TheFilterIsAnyCellIgnoringCase) {
     model.setFilter("BARR");
     EXPECT_EQ(keys(), "9 ");

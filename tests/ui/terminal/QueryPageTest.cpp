@@ -141,6 +141,20 @@ TEST_F(QueryPageTest, EnterGoesToThePacketOrTheTimeOfARow) {
     EXPECT_EQ(stage.went.back(), drive.timeline->instantAt(first.time));
 }
 
+TEST_F(QueryPageTest, ATimeHasItsTimeOfDayBesideIt) {
+    stage.ahead = std::chrono::hours(1);
+    ask("select 7 as number, 1700000000999999 as time union all select 8, null");
+    EXPECT_EQ(stage.line(2), " number              time  clock");
+    EXPECT_EQ(stage.line(3), "▌     7  1700000000999999  23:13:20");
+    EXPECT_EQ(stage.line(4), "      8");
+    for (const char* query : {";select -5 as time", ";select 'noon' as time", ";select 7 as times",
+                              ";select 0 as time where false"}) {
+        stage.type(query);
+        stage.press(Key::Enter);
+        EXPECT_FALSE(shows("clock")) << query;
+    }
+}
+
 TEST_F(QueryPageTest, ARowWithoutAnInstantSaysSo) {
     for (const char* query :
          {"select kind from event", "select 99999999 as packet", "select -1 as packet",

@@ -46,6 +46,15 @@ TEST_F(SearchPageTest, HitsThatAreLeftOutAreTold) {
     stage.tick(valuesOf(TextFinder::kMostHits + 1));
     EXPECT_TRUE(shows("Find in this frame (first 1,000 hits)")) << stage.screen();
     EXPECT_TRUE(shows("1000 hits"));
+    stage.press(Key::Enter);
+    stage.type("n");
+    EXPECT_TRUE(shows("same: 2 of 1000 (there are more)")) << stage.screen();
+    stage.type("NN");
+    EXPECT_TRUE(shows("same: 1000 of 1000 (there are more)")) << "the last that is known";
+    stage.tick(valuesOf(TextFinder::kMostHits));
+    stage.type("n");
+    EXPECT_TRUE(shows("same: 1 of 1000")) << stage.screen();
+    EXPECT_FALSE(shows("there are more"));
 }
 
 TEST_F(SearchPageTest, RowsAreListedAsTheTextIsTyped) {
