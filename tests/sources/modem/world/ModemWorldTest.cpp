@@ -3,7 +3,9 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <filesystem>
 #include <string>
+#include <unistd.h>
 
 // The real program on modems that scripts play, through the real ModemManager where it can.
 
@@ -18,6 +20,8 @@ const std::string kWorlds = PALLAX_SOURCE_DIR "/tests/sources/modem/world/";
 
 class ModemWorld : public testing::Test {
 protected:
+    ~ModemWorld() override { std::filesystem::remove(_printedPolicy); }
+
     void SetUp() override {
         for (const char* program : {"dbus-daemon", "gdbus", "mmcli", "python3", "setpriv"}) {
             if (!isInstalled(program)) {
@@ -33,6 +37,34 @@ protected:
                           world + " -- bash -c '. " + kWorlds + "steps.bash\n" + steps +
                           "' >$told.world 2>&1 || cat $told.world; cat $told; rm $told*");
     }
+
+    /// The same, all of it as an ordinary user, also if the test's user is root.
+    static CommandRun asOrdinaryUserIn(const std::string& world, const std::string& steps) {
+        const bool isRoot = ::geteuid() == 0;
+        const std::string asNobody = "setpriv --reuid=65534 --regid=65534 --clear-groups ";
+        return runCommand("told=$(mktemp); chmod 666 $told; STEPS_OUT=$told "
+                          "PALLAX=" PALLAX_PROGRAM " " +
+                          (isRoot ? asNobody : "") + kWorlds + world + " -- bash -c '. " + kWorlds +
+                          "steps.bash\n" + steps +
+                          "' >$told.world 2>&1 || cat $told.world; cat $told; rm $told*");
+    }
+
+    /// Arguments for ModemManager's policy of the system bus.
+    static std::string policy() {
+        const auto installed =
+            runCommand("dpkg -L modemmanager | "
+                       "grep 'dbus-1/system.d/org.freedesktop.ModemManager1.conf'");
+        return " --policy " + installed.out.substr(0, installed.out.find('\n'));
+    }
+    /// Arguments for the policy that Pallax prints. The bus may read it before ModemManager's.
+    std::string printedPolicy() const {
+        EXPECT_EQ(runCommand(PALLAX_PROGRAM " modem --policy >" + _printedPolicy).status, 0);
+        return " --policy " + _printedPolicy;
+    }
+
+private:
+    std::string _printedPolicy =
+        testing::TempDir() + std::to_string(::getpid()) + "-pallax-cells.conf";
 };
 
 TEST_F(ModemWorld, AnAtModemAppearsMovesLosesServiceAndComesBack) {
@@ -126,6 +158,44 @@ TEST_F(ModemWorld, WithoutRightsThePictureSaysWhy) {
                        "Signal/Levels: not permitted\n"
                        "Signal/Quality: 64 %\n"
                        "Serving Cell/Source: not permitted\n");
+}
+
+constexpr const char* kWhatAnOrdinaryUserSees = R"steps(
+        test "$(id -u)" = 0 && echo root
+        begin_pallax modem --print
+        shows "Modem/State: registered"
+        shows "Registration/Operator: SampleNet"
+        shows "Signal/LTE RSRP: -95.0 dBm"
+        shows "Serving Cell/Cell ID: 13828438"
+        shows "SIM/Operator Code: 26242"
+        shows "Serving Cell/Cell Information: $CELLS"
+        end_pallax
+        "$PALLAX" modem --list | grep -c "cells not permitted")steps";
+
+TEST_F(ModemWorld, AnOrdinaryUserSeesAllButCells) {
+    const auto run = asOrdinaryUserIn(
+        "at-world" + policy(), std::string("CELLS=\"not permitted\"") + kWhatAnOrdinaryUserSees);
+    EXPECT_EQ(run.out, "Modem/State: registered\n"
+                       "Registration/Operator: SampleNet\n"
+                       "Signal/LTE RSRP: -95.0 dBm\n"
+                       "Serving Cell/Cell ID: 13828438\n"
+                       "SIM/Operator Code: 26242\n"
+                       "Serving Cell/Cell Information: not permitted\n"
+                       "1\n");
+}
+
+TEST_F(ModemWorld, WithThePrintedPolicyAnOrdinaryUserMayAskForCells) {
+    // The question reaches ModemManager, which has no cells of an AT modem.
+    const auto run = asOrdinaryUserIn("at-world" + printedPolicy() + policy(),
+                                      std::string("CELLS=\"not supported by this modem\"") +
+                                          kWhatAnOrdinaryUserSees);
+    EXPECT_EQ(run.out, "Modem/State: registered\n"
+                       "Registration/Operator: SampleNet\n"
+                       "Signal/LTE RSRP: -95.0 dBm\n"
+                       "Serving Cell/Cell ID: 13828438\n"
+                       "SIM/Operator Code: 26242\n"
+                       "Serving Cell/Cell Information: not supported by this modem\n"
+                       "0\n");
 }
 
 TEST_F(ModemWorld, ARecordingIsMadeInOneStepAndTheRateIsPutBack) {

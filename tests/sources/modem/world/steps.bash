@@ -11,6 +11,7 @@ trap 'end_pallax; rm -rf "$folder"' EXIT
 
 # begin_pallax ARGUMENT...: in the background; what it prints is looked at by `shows`.
 begin_pallax() {
+    : >"$folder/out"
     "$PALLAX" "$@" >"$folder/out" 2>"$folder/err" </dev/null &
     pallax_pid=$!
 }
