@@ -7,6 +7,7 @@ Runs a command there and gives its exit status. Lines written into $WORLD/contro
   missing   a modem without any property
   huge      texts of 1 MiB, with control characters
   flood N   N signals of changed levels, as fast as the bus takes them
+  level DBM the RSRP of the first modem
   crowd N   N modems appear
   gone      they disappear
   sane      the first modem as it was at the start
@@ -85,6 +86,8 @@ class Manager(dbus.service.Object):
         elif word == "flood":
             for number in range(int(count)):
                 first.PropertiesChanged(SIGNAL, dictionary(Lte=dictionary(rsrp=dbus.Double(-60 - number % 60))), [])
+        elif word == "level":
+            first.PropertiesChanged(SIGNAL, dictionary(Lte=dictionary(rsrp=dbus.Double(float(count)))), [])
         elif word == "crowd":
             for number in range(1, int(count) + 1):
                 self.InterfacesAdded(f"{ROOT}/Modem/{number}", sane(f"Crowd {number}"))

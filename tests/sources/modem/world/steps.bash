@@ -3,6 +3,7 @@
 # shellcheck shell=bash
 
 exec >"$STEPS_OUT" 2>&1
+WORLDS=$(dirname "${BASH_SOURCE[0]}")
 folder=$(mktemp -d "${TMPDIR:-/tmp}/modem-steps.XXXXXX")
 mkdir -m 700 "$folder/run"
 export XDG_RUNTIME_DIR=$folder/run HOME=$folder XDG_CONFIG_HOME=$folder
