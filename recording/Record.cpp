@@ -49,8 +49,6 @@ ExitStatus record(const RecordOptions& options) {
             return kExitFailure;
         }
         child = std::move(started).value();
-        progress.wipe();
-        passOnComplaints(child->takeComplaints()); // what it waits for
     }
     std::optional<std::string> failure;
     {

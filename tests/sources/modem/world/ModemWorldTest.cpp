@@ -228,15 +228,10 @@ TEST_F(ModemWorld, WithoutABusOrModemManagerOneSentenceTellsIt) {
         "$PALLAX" modem --list; echo "status $?"
         begin_pallax modem --print
         shows "Modem/State: ModemManager is not running"
-        end_pallax >"$folder/told"
-        "$PALLAX" record --modem "$folder/drive.pcapng" 2>"$folder/err" &
-        pallax_pid=$!
-        until [ -s "$folder/err" ]; do sleep 0.1; done
-        end_pallax | head -n 1)steps");
+        end_pallax)steps");
     EXPECT_EQ(noManager.out, "pallax: ModemManager is not running.\n"
                              "status 1\n"
-                             "Modem/State: ModemManager is not running\n"
-                             "pallax: ModemManager is not running; Pallax waits for it.\n");
+                             "Modem/State: ModemManager is not running\n");
 }
 
 TEST_F(ModemWorld, AMockOfACdmaModemAndOfOneThatTellsNrCells) {
