@@ -34,6 +34,7 @@ constexpr std::array<Names, 3> kToGsm{"RR_W2G_INTERRAT_RESELECTION_PROGRESS",
                                       "RR_W2G_INTERRAT_CC_ORDER_ PROGRESS"};
 
 // Service and registration.
+constexpr std::array<Names, 1> kNoTechnology{"unknown"};
 constexpr std::array<Names, 1> kIfxNetwork{"ifx.network.mcc"};
 constexpr std::array<Names, 1> kIfxRegistration{"ifx.registration.state"};
 constexpr std::array<Names, 7> kIfxRegistered{"home",
@@ -80,7 +81,7 @@ constexpr auto kRows = std::to_array<EventFields>({
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxLocated},
     {"ifx", Watch::State, "RR", kIfxRr},
     {"ifx", Watch::State, "modem", kIfxModem},
-    {"ifx", Watch::State, "technology", kIfxTechnology},
+    {"ifx", Watch::State, "technology", kIfxTechnology, {}, kNoTechnology},
     {"ifx", Watch::Service, "service", kIfxNetwork},
     {"ifx", Watch::Service, "registration", kIfxRegistration, kIfxRegistered, kIfxUnregistered},
     {"ifx", Watch::Contexts, "connection", kIfxConnections},

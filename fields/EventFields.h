@@ -41,7 +41,8 @@ struct EventFields {
     /// Of a State: values between which an idle phone changes all the time, without an event.
     /// Of Service: the values of a phone that has it; if there are none, any value.
     std::span<const std::string_view> good = {};
-    /// Of a Cell: values of the first field that name none. Of Service: the values of a phone that
+    /// Of a Cell: values of the first field that name none. Of a State: values that tell nothing,
+    /// so that the state before them counts. Of Service: the values of a phone that
     /// has lost it, as it has when the field is removed. Values in neither change nothing.
     std::span<const std::string_view> bad = {};
 };

@@ -153,7 +153,7 @@ void EventFinder::lookAtCell(Row& row, const Moment& moment) {
 
 void EventFinder::lookAtState(Row& row, const Moment& moment) {
     std::vector<std::string> state = textsOf(moment.values, row.fields);
-    if (state == row.value || state.front().empty()) {
+    if (state == row.value || state.front().empty() || isAmong(row.rule->bad, state.front())) {
         return;
     }
     if (row.rule->watch == Watch::Technology) {

@@ -124,9 +124,10 @@ std::string_view cellPolicy() {
  "http://www.freedesktop.org/standards/dbus/1.0/busconfig.dtd">
 <!-- Lets every user of this machine ask ModemManager for the cells that a modem receives, which
      the bus reserves for root. ModemManager then asks polkit, which allows it to users who sit at
-     the machine. An administrator saves this as /etc/dbus-1/system.d/pallax-cells.conf. -->
+     the machine. An administrator saves this as /etc/dbus-1/system.d/pallax-cells.conf. The context
+     is mandatory because the bus reads the files of that folder in any order. -->
 <busconfig>
-  <policy context="default">
+  <policy context="mandatory">
     <allow send_destination="org.freedesktop.ModemManager1"
            send_interface="org.freedesktop.ModemManager1.Modem"
            send_member="GetCellInfo"/>

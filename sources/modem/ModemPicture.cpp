@@ -440,7 +440,7 @@ Dictionary Painter::modem() const {
     Dictionary section;
     const auto state = integerIn(*_modem, "State");
     addWord(section, "State", isThere() ? modem_words::ofState(state.value_or(0)) : absence());
-    addWord(section, "Model", kUnknown);
+    section.setFixed("Model", _view.model.empty() ? std::string(kUnknown) : shownText(_view.model));
     add(section, "Model", *_modem, "Model");
     add(section, "Manufacturer", *_modem, "Manufacturer");
     add(section, "Revision", *_modem, "Revision");

@@ -22,6 +22,7 @@ struct ModemView {
     enum class Presence { NoBus, NoManager, Waiting, Unplugged, There };
 
     Presence presence = Presence::Waiting; ///< Waiting: for any modem
+    std::string model;                     ///< the latest known, also while the modem is away
     /// By the interface's full name.
     Dictionary interfaces;
     Dictionary sim;

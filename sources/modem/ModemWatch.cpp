@@ -90,7 +90,9 @@ void ModemWatch::choose() {
 }
 
 void ModemWatch::forgetModem() {
+    std::string model = std::move(_view.model);
     _view = ModemView();
+    _view.model = std::move(model);
     _path.clear();
     _simPath.clear();
     _bearerPaths.clear();
@@ -112,6 +114,9 @@ bool ModemWatch::isEnabled() const {
 
 void ModemWatch::readModem() {
     _view.interfaces = *_objects.find(_path);
+    if (const DictionaryRef modem = dictionaryIn(_view.interfaces, kModem)) {
+        _view.model = textIn(*modem, "Model").value_or(_view.model);
+    }
     readSim();
     readBearers();
     const bool isNowEnabled = isEnabled();

@@ -154,6 +154,20 @@ TEST_F(EndToEndStatus, OfDemo) {
     expectEveryDocumentedStatus({"demo"});
 }
 
+TEST_F(EndToEndStatus, OfModem) {
+    ends({{"modem", "--policy"}, 0, "", "/dev/null", world.path("policy")});
+    ends({{"modem", "--list"},
+          1,
+          "pallax: There is no system bus, through which ModemManager is asked.\n",
+          "/dev/null",
+          "",
+          {"DBUS_SYSTEM_BUS_ADDRESS=unix:path=" + world.path("no-bus")}});
+    ends({{"modem", "--list", "--policy"},
+          2,
+          "pallax: --list excludes --policy (see pallax modem --help)\n"});
+    expectEveryDocumentedStatus({"modem"});
+}
+
 TEST_F(EndToEndStatus, OfSimulate) {
     ends({{"simulate", "lte", "--seconds", "2", "-o", world.path("new.pcap")}, 0, ""});
     ends({{"simulate", "lte", "--seconds", "2", "-o", "/dev/full"},

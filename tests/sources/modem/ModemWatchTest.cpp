@@ -265,5 +265,16 @@ TEST_F(ModemWatchTest, SignalsAboutNothingKnownChangeNothing) {
     EXPECT_EQ(PropertyList(watch.view().interfaces), PropertyList(interfacesOfLte()));
 }
 
+TEST_F(ModemWatchTest, TheModelStaysKnownWhileTheModemIsAway) {
+    ModemWatch& watch = withModem();
+    const std::string model = watch.view().model;
+    EXPECT_FALSE(model.empty());
+    watch.interfacesRemoved(kPath, {"org.freedesktop.ModemManager1.Modem"});
+    EXPECT_EQ(watch.view().presence, ModemView::Presence::Unplugged);
+    EXPECT_EQ(watch.view().model, model);
+    watch.managerLeft(ModemView::Presence::NoManager);
+    EXPECT_EQ(watch.view().model, model);
+}
+
 } // namespace
 } // namespace pallax

@@ -3,6 +3,7 @@
 # shellcheck shell=bash
 
 exec >"$STEPS_OUT" 2>&1
+WORLDS=$(dirname "${BASH_SOURCE[0]}")
 folder=$(mktemp -d "${TMPDIR:-/tmp}/modem-steps.XXXXXX")
 mkdir -m 700 "$folder/run"
 export XDG_RUNTIME_DIR=$folder/run HOME=$folder XDG_CONFIG_HOME=$folder
@@ -11,6 +12,7 @@ trap 'end_pallax; rm -rf "$folder"' EXIT
 
 # begin_pallax ARGUMENT...: in the background; what it prints is looked at by `shows`.
 begin_pallax() {
+    : >"$folder/out"
     "$PALLAX" "$@" >"$folder/out" 2>"$folder/err" </dev/null &
     pallax_pid=$!
 }
