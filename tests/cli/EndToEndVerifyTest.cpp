@@ -10,8 +10,8 @@ TEST_F(EndToEndVerify, TellsThatARecordingIsWhatItWas) {
     const Run unknown = run({"verify", file});
     EXPECT_EQ(unknown.status, 3);
     EXPECT_EQ(unknown.err, "pallax: " + file +
-                               ".pallax-verify cannot be read: No such file or directory; "
-                               "--update writes it.\n");
+                               " has no digests: unchanged cannot be told; --update writes some "
+                               "beside it.\n");
     EXPECT_EQ(run({"verify", "--update", file}).status, 0);
     const Run same = run({"verify", file});
     EXPECT_EQ(same.status, 0);
@@ -25,7 +25,7 @@ TEST_F(EndToEndVerify, TellsThatItIsNot) {
     ASSERT_EQ(run({"verify", "--update", file}).status, 0);
     const Run different = run({"verify", "--expect", file + ".pallax-verify", other});
     EXPECT_EQ(different.status, 1);
-    EXPECT_EQ(different.out, other + ": 1 packets instead of 51\n");
+    EXPECT_EQ(different.out, other + ": 1 packet instead of 51\n");
 }
 
 TEST_F(EndToEndVerify, ExpectationsAreAboutOneRecording) {
