@@ -9,7 +9,7 @@ namespace pallax {
 
 namespace {
 
-constexpr std::uint32_t kCustomBlock = 0x40000BAD; // of the kind that is not to be copied
+constexpr std::uint32_t kLocalBlock = 0x80000BAD; // of the range for local use
 constexpr std::uint32_t kMaker = 32473;
 constexpr std::string_view kName = "pallaxd1";
 constexpr std::size_t kBodyAt = 8; // in the block
@@ -41,7 +41,7 @@ std::uint64_t numberIn(Bytes bytes, std::size_t at, std::size_t width) {
 /// The block up to its digest.
 ByteBuffer head(std::uint64_t packets, bool isLast, bool isBigEndian) {
     ByteBuffer bytes;
-    put(bytes, kCustomBlock, kWordSize, isBigEndian);
+    put(bytes, kLocalBlock, kWordSize, isBigEndian);
     put(bytes, EmbeddedDigests::kBlockSize, kWordSize, isBigEndian);
     put(bytes, kMaker, kWordSize, isBigEndian);
     bytes.insert(bytes.end(), kName.begin(), kName.end());

@@ -56,12 +56,12 @@ TEST_F(EmbeddedCheckTest, ARecordingThatWasEndedIsWhole) {
     }
 }
 
-TEST_F(EmbeddedCheckTest, ADigestIsABlockOfTheMakerOfExamples) {
+TEST_F(EmbeddedCheckTest, ADigestIsABlockForLocalUse) {
     using namespace std::string_literals;
     const std::string content = record(1);
     ASSERT_EQ(content.size(), kHead + kPacket + kBlock);
     EXPECT_EQ(content.substr(kHead + kPacket, 32), // up to the digest
-              "\xAD\x0B\0\x40\x44\0\0\0\xD9\x7E\0\0pallaxd1\x01\0\0\0\0\0\0\0\x01\0\0\0"s);
+              "\xAD\x0B\0\x80\x44\0\0\0\xD9\x7E\0\0pallaxd1\x01\0\0\0\0\0\0\0\x01\0\0\0"s);
     EXPECT_EQ(content.substr(content.size() - 4), "\x44\0\0\0"s);
 }
 
