@@ -10,9 +10,10 @@ namespace pallax {
 
 struct CapturePiece;
 
-/// The digests within a recording in pcapng: after every 1,024 packets and at the end, a block with a
-/// digest of all bytes since the previous one. Its type is of the range for local use, because some
-/// readers count custom blocks as packets. They show damage, not forgery. Its body, offsets in bytes:
+/// The digests within a recording in pcapng: after every 1,024 packets and at the end, a block with
+/// a digest of all bytes since the previous one. Its type is of the range for local use, because
+/// some readers count custom blocks as packets. They show damage, not forgery. Its body, offsets in
+/// bytes:
 ///
 ///   0   number of the maker (32 bits, in the section's byte order): 32473, which is reserved for
 ///       examples
