@@ -48,6 +48,7 @@ ScreenSession::Screen ScreenBrowser::screen(const Setup& setup) {
             .copy = [this](const std::string& text) { _terminal.copy(text); },
             .ringBell = [this] { _terminal.ringBell(); },
             .chooseModem = [this](std::size_t number) { _split.choose(number); },
+            .switchSafe = [this] { switchSafe(); },
             .mayGoOn = [this](const auto& tell) { return mayGoOn(tell); }};
 }
 
@@ -67,6 +68,27 @@ terminal::SplitScreen ScreenBrowser::splitScreen() {
         modems.push_back({session->name(), session->frontEnd()});
     }
     return {std::move(modems), _marks, [this] { needsDisplay(); }};
+}
+
+/// All modems at once, because all are on the screen.
+void ScreenBrowser::switchSafe() {
+    const auto refuse = [this](const std::string& sentence) {
+        for (const auto& session : _sessions) {
+            session->frontEnd().setMessage(sentence);
+        }
+    };
+    if (_screen.isSafe) {
+        return refuse("The viewer was started with --safe and stays so.");
+    }
+    for (const auto& session : _sessions) {
+        if (!session->canStartAfresh()) {
+            return refuse("A stream can be played only once: start the viewer with --safe.");
+        }
+    }
+    _isSafe = !_isSafe;
+    for (const auto& session : _sessions) {
+        session->setSafe(_isSafe);
+    }
 }
 
 /// Tells of work that takes long, and looks for the key that stops it.

@@ -40,6 +40,7 @@ private:
     ScreenSession::Screen screen(const Setup& setup);
     Sessions sessions(std::vector<ScreenSession::Shown> shown) const;
     terminal::SplitScreen splitScreen();
+    void switchSafe();
     bool mayGoOn(const std::function<void()>& tell);
     void waitForKey();
     void readKey();
@@ -56,6 +57,7 @@ private:
     const terminal::Marks _marks;
     const ScreenSession::Screen _screen;
     const Sessions _sessions;
+    bool _isSafe = false; ///< by a key
     terminal::SplitScreen _split;
     std::optional<std::chrono::steady_clock::time_point> _workBegan; ///< since the latest key
     std::chrono::steady_clock::time_point _lookedForKey;

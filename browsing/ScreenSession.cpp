@@ -15,7 +15,7 @@
 namespace pallax {
 
 ScreenSession::ScreenSession(const Screen& screen, Shown shown)
-    : _screen(screen), _name(sourceName(shown.source)),
+    : _screen(screen), _name(sourceName(shown.source)), _isReadOnce(isReadOnce(shown.source)),
       _link(screen.queue, std::move(shown.directory), screen.onFatalRecord, shown.child,
             screen.notices),
       _safe(_link.resources()), _watch(_link.resources()),
@@ -40,10 +40,9 @@ ScreenSession::ScreenSession(const Screen& screen, Shown shown)
                    _frontEnd.toolkit().showAlert({"Alarms that are left out", text, "Close"});
                }}),
       _frontEnd(frontEndSurroundings(), screen.marks), _preferences(FilePreferences::userFolder()),
-      _session(sessionSurroundings(isReadOnce(shown.source))) {
-    if (screen.isSafe) {
-        _link.setFilter([this](Bytes packet) { return _safe.masked(packet); });
-    }
+      _session(sessionSurroundings(_isReadOnce)) {
+    mask(screen.isSafe);
+    _frontEnd.setSafe(screen.isSafe);
     _frontEnd.showListsAsTables(screen.settings.lists == Lists::Table);
     if (screen.settings.firstScreen == FirstScreen::Overview) {
         _frontEnd.openOverview();
@@ -60,6 +59,22 @@ void ScreenSession::start() {
         [this](const std::string& text) { _frontEnd.setStream(text); }});
     _ticking = _link.clock().scheduleRepeating(PallaxModel::kDisplayInterval, [this] { tick(); });
     _session.start();
+}
+
+void ScreenSession::setSafe(bool isSafe) {
+    _travel.reset();
+    _frontEnd.forgetTimeline();
+    _timeline.restart(isSafe);
+    mask(isSafe);
+    _session.startAfresh();
+    _frontEnd.setSafe(isSafe);
+}
+
+/// Applies to the packets that follow.
+void ScreenSession::mask(bool isSafe) {
+    _link.setFilter(
+        isSafe ? LinkPorts::PacketFilter([this](Bytes packet) { return _safe.masked(packet); })
+               : nullptr);
 }
 
 bool ScreenSession::mayGoOn(const std::string& words) {
@@ -96,7 +111,8 @@ terminal::FrontEnd::Surroundings ScreenSession::frontEndSurroundings() {
             .ahead = [this] { return _link.clock().zone(_link.clock().now()).offset; },
             .travel = &_travel,
             .chooseModem = _screen.chooseModem,
-            .profile = [this]() -> const QualityProfile& { return _screen.profile; }};
+            .profile = [this]() -> const QualityProfile& { return _screen.profile; },
+            .switchSafe = _screen.switchSafe};
 }
 
 Travel::Surroundings ScreenSession::travelSurroundings() {

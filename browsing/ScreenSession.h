@@ -37,12 +37,13 @@ public:
         const Settings& settings;
         const QualityProfile& profile; ///< judges levels
         OnFatalRecord onFatalRecord;
-        bool isSafe;                        ///< nothing that identifies a person is shown
+        bool isSafe;                        ///< from the beginning: see `setSafe`
         std::function<void()> needsDisplay; ///< requests a drawing soon
         std::function<void()> repaint;
         std::function<void(const std::string& text)> copy; ///< to the clipboard
         std::function<void()> ringBell;
         std::function<void(std::size_t number)> chooseModem;
+        std::function<void()> switchSafe; ///< for all sessions
         /// Asked often during long work: false stops it. If it takes long, `tell` is called.
         std::function<bool(const std::function<void()>& tell)> mayGoOn;
     };
@@ -65,6 +66,11 @@ public:
     /// What is shown, in a few words.
     const std::string& name() const { return _name; }
     terminal::FrontEnd& frontEnd() { return _frontEnd; }
+    /// Whether the source could be played again.
+    bool canStartAfresh() const { return !_isReadOnce; }
+    /// Shows nothing that identifies a person, or everything again: starts afresh with packets that
+    /// are masked as they arrive, or not, so that nothing of the time before is left.
+    void setSafe(bool isSafe);
     /// Says why the past is not whole, each time it is looked at.
     void tellTrouble();
 
@@ -74,6 +80,7 @@ private:
     terminal::FrontEnd::Surroundings frontEndSurroundings();
     bool mayGoOn(const std::string& words);
     void begin(const std::string& technology);
+    void mask(bool isSafe);
     void tick();
     terminal::QuerySeams querySeams();
     const NetworkNames& names();
@@ -83,6 +90,7 @@ private:
 
     const Screen& _screen;
     const std::string _name;
+    const bool _isReadOnce;
     BrowseLink _link;
     SafePackets _safe;
     StatusWatch _watch;

@@ -28,7 +28,8 @@ std::unique_ptr<RecordingJournal> journalOf(const Source& source) {
 } // namespace
 
 ViewedTimeline::ViewedTimeline(const Setup& setup)
-    : _link(setup.link), _recording(setup.onlyWhatHasCome ? nullptr : journalOf(setup.source)),
+    : _link(setup.link), _source(setup.source),
+      _recording(setup.onlyWhatHasCome ? nullptr : journalOf(setup.source)),
       _slices(setup.link.queue(), [indexed = setup.indexed](Timeline&) { indexed(); }),
       _live({.queue = setup.link.queue(),
              .resources = setup.link.resources(),
@@ -52,6 +53,15 @@ void ViewedTimeline::begin(std::string_view technology) {
         _growth =
             _link.queue().scheduleRepeating(kLookForGrowth, [this] { _slices.start(*_whole); });
     }
+}
+
+void ViewedTimeline::restart(bool onlyWhatHasCome) {
+    _growth.reset();
+    _slices.stop();
+    _whole.reset();
+    _live.forget();
+    _recording = onlyWhatHasCome ? nullptr : journalOf(_source);
+    _technology = nullptr;
 }
 
 void ViewedTimeline::add(Bytes packet, Time time) {

@@ -41,6 +41,8 @@ public:
     /// The packets that follow are of the technology with this identifier; empty: not known yet.
     void begin(std::string_view technology);
     void add(Bytes packet, Time time);
+    /// Drops everything, before the source is played again. `onlyWhatHasCome` is as in the setup.
+    void restart(bool onlyWhatHasCome);
 
     /// Null before the first packet.
     Timeline* timeline();
@@ -51,6 +53,7 @@ public:
 
 private:
     BrowseLink& _link;
+    const Source _source;
     const RecordedTechnology* _technology = nullptr;
     std::unique_ptr<RecordingJournal> _recording; ///< null if packets are kept as they come
     std::unique_ptr<Timeline> _whole;             ///< of the recording

@@ -199,6 +199,9 @@ ParsedOptions CommandLine::chosen() const {
     if (_app->got_subcommand("mask") && _mask.output.empty() && !_mask.check) {
         return wrongUsage("--output or --check is required", "mask");
     }
+    if (_mask.output == "-") {
+        return wrongUsage("a masked copy is a file, not standard output", "mask");
+    }
     if (!_verify.expect.empty() && _verify.recordings.size() > 1) {
         return wrongUsage("--expect is about one recording", "verify");
     }

@@ -62,9 +62,14 @@ have changed, and which fields decode otherwise in which minutes, such as after
 an update. --expect reads, or with --update writes, another file: a recording
 with such a file says what is expected of a decoder.
 
+Without such a file, verify asks the digests that pallax record writes into its
+pcapng files, one for each 1024 packets and one at the end, and tells whether
+the recording is whole and unchanged. If the recorder was killed, the packets
+after the last digest have none, and verify says how many: status 3.
+
 The digests (SHA-256) show damage and drift. They do not show forgery: who
-changes a recording can write them anew. Damage to what is not a packet, such as
-a comment, is not shown.
+changes a recording can write them anew. Those beside a recording do not show
+damage to what is not a packet, such as a comment; those within it do.
 
 Exit status:
   0   every recording is what it was; with --update, the digests are written

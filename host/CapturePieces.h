@@ -34,11 +34,15 @@ struct CapturePiece {
     std::uint32_t blockType = 0; ///< of pcapng
     bool isBigEndian = false;
 
+    /// Whether a section of pcapng begins with it.
+    bool isSection() const { return blockType == kSectionType; }
     Bytes packet() const { return Bytes(bytes).subspan(data, dataLength); }
     /// Replaces the bytes of the packet, in place if the length is the same.
     void setPacket(Bytes packet);
 
 private:
+    static constexpr std::uint32_t kSectionType = 0x0A0D0D0A;
+
     void setNumber(std::size_t at, std::uint32_t number);
 };
 
@@ -46,9 +50,6 @@ private:
 /// much is refused before memory is taken for it.
 class CapturePieces {
 public:
-    /// The block type of pcapng for blocks of any maker; the number of the maker follows.
-    static constexpr std::uint32_t kCustomBlock = 0x00000BAD;
-
     /// Takes the content.
     CapturePieces(RecordingContent content, std::string name);
     ~CapturePieces();
@@ -58,7 +59,7 @@ public:
     /// Nothing at the end, or if `error` is set.
     std::optional<CapturePiece> next();
     const std::optional<RecordingError>& error() const { return _error; }
-    bool isPcapNg() const { return _isPcapNg; }
+    const std::string& name() const { return _name; }
 
 private:
     struct Interface {

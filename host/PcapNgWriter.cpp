@@ -147,7 +147,7 @@ std::optional<HostError> PcapNgWriter::beginSection() {
     if (_isFile && ::ftruncate(_number, 0) != 0) {
         return unwritableRecording(_name, errno);
     }
-    return put(sectionHeader());
+    return putHashed(sectionHeader());
 }
 
 std::optional<HostError> PcapNgWriter::begin(int linkType, std::string_view name) {
@@ -155,14 +155,14 @@ std::optional<HostError> PcapNgWriter::begin(int linkType, std::string_view name
         return error;
     }
     const std::size_t roughSize = 32 + name.size();
-    return put(Block(kInterface, roughSize)
-                   .u16(static_cast<std::uint16_t>(linkType))
-                   .u16(0)
-                   .u32(kLargestPacket)
-                   .option(kInterfaceName, name)
-                   .option(kStampResolution, {&kNanoseconds, 1})
-                   .option(kEndOfOptions, {})
-                   .finish());
+    return putHashed(Block(kInterface, roughSize)
+                         .u16(static_cast<std::uint16_t>(linkType))
+                         .u16(0)
+                         .u32(kLargestPacket)
+                         .option(kInterfaceName, name)
+                         .option(kStampResolution, {&kNanoseconds, 1})
+                         .option(kEndOfOptions, {})
+                         .finish());
 }
 
 std::uint64_t PcapNgWriter::sizeOfPacket(std::size_t length) {
@@ -175,16 +175,30 @@ std::optional<HostError> PcapNgWriter::write(Time time, Bytes packet) {
     const auto sinceEpoch = std::max<std::int64_t>(time.time_since_epoch().count(), 0);
     const auto stamp = static_cast<std::uint64_t>(sinceEpoch);
     const auto length = static_cast<std::uint32_t>(packet.size());
-    auto error = put(Block(kEnhancedPacket, kPacketHead + packet.size())
-                         .u32(kOnlyInterface)
-                         .u32(static_cast<std::uint32_t>(stamp >> kHalf))
-                         .u32(static_cast<std::uint32_t>(stamp))
-                         .u32(length)
-                         .u32(length)
-                         .data(packet)
-                         .finish());
-    _packets += error ? 0 : 1;
-    return error;
+    auto error = putHashed(Block(kEnhancedPacket, kPacketHead + packet.size())
+                               .u32(kOnlyInterface)
+                               .u32(static_cast<std::uint32_t>(stamp >> kHalf))
+                               .u32(static_cast<std::uint32_t>(stamp))
+                               .u32(length)
+                               .u32(length)
+                               .data(packet)
+                               .finish(),
+                           true);
+    if (error) {
+        return error;
+    }
+    ++_packets;
+    return _digests.isDue() ? put(_digests.block(false)) : std::nullopt;
+}
+
+std::optional<HostError> PcapNgWriter::finish() {
+    const bool isWritten = _packets > 0 && !_hasFailed && !interference();
+    return isWritten ? put(_digests.block(true)) : std::nullopt;
+}
+
+std::uint64_t PcapNgWriter::sizeWith(std::size_t length) const {
+    const bool isDue = (_packets + 1) % EmbeddedDigests::kPacketsOfBlock == 0;
+    return _size + sizeOfPacket(length) + (isDue ? 2 : 1) * EmbeddedDigests::kBlockSize;
 }
 
 /// The size of the file at the path, if it is the file being written.
@@ -208,18 +222,28 @@ std::optional<HostError> PcapNgWriter::interference() const {
         formatText("The recording %@ was %@ while it was being written.", {_name, what})};
 }
 
+std::optional<HostError> PcapNgWriter::putHashed(const ByteBuffer& block, bool isPacket) {
+    auto error = put(block);
+    if (!error) {
+        _digests.add(block, isPacket);
+    }
+    return error;
+}
+
 std::optional<HostError> PcapNgWriter::put(const ByteBuffer& block) {
     std::size_t written = 0;
     while (written < block.size()) {
         const ssize_t count = ::write(_number, block.data() + written, block.size() - written);
         if (count < 0 && errno == EINTR) {
             if (Interruption::isDue()) {
+                _hasFailed = true;
                 return untakenRecording(_name, written == 0);
             }
             continue;
         }
         if (count <= 0) {
             const int error = count < 0 ? errno : ENOSPC;
+            _hasFailed = true;
             if (_file) { // the reader of standard output already has the rest
                 (void)!::ftruncate(_number, static_cast<off_t>(_size));
             }

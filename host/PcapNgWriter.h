@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/Descriptor.h"
+#include "host/EmbeddedDigests.h"
 #include "host/FileIdentity.h"
 #include "host/HostError.h"
 #include "text/Bytes.h"
@@ -21,8 +22,11 @@ namespace pallax {
 /// crash loses at most the last one, and if a packet cannot be written completely (a full disk) the
 /// file is cut back to the previous packet.
 ///
-/// A new file can be read by its user alone (0600). The file is locked while it is written. An existing file keeps its content until the first
-/// packet arrives, and a new file that gets none is removed at the end.
+/// A block with a digest follows every 1,024 packets and the last one (EmbeddedDigests).
+///
+/// A new file can be read by its user alone (0600). The file is locked while it is written. An
+/// existing file keeps its content until the first packet arrives, and a new file that gets none is
+/// removed at the end.
 class PcapNgWriter {
 public:
     /// The largest packet that capture readers accept.
@@ -43,6 +47,9 @@ public:
     /// Writes a packet of at most kLargestPacket bytes; a time before 1970 is written as 1970.
     /// Returns nothing on success, otherwise an error; then nothing more can be written.
     std::optional<HostError> write(Time time, Bytes packet);
+    /// Writes the digest that ends the recording, if it has packets; then nothing more may be
+    /// written. A recording that failed has no end.
+    std::optional<HostError> finish();
     /// Nothing if the path still leads to the unchanged file; otherwise an error that the file was
     /// removed, moved, replaced or changed, so packets may be lost.
     std::optional<HostError> interference() const;
@@ -55,6 +62,8 @@ public:
     std::uint64_t size() const { return _size; }
     /// The bytes in the file for a packet of `length` bytes.
     static std::uint64_t sizeOfPacket(std::size_t length);
+    /// The bytes in the file if it ends after another packet.
+    std::uint64_t sizeWith(std::size_t length) const;
 
 private:
     PcapNgWriter(std::string name, Descriptor file, int number)
@@ -63,6 +72,7 @@ private:
     std::optional<HostError> beginSection();
     std::optional<std::uint64_t> sizeInPlace() const;
     std::optional<HostError> put(const ByteBuffer& block);
+    std::optional<HostError> putHashed(const ByteBuffer& block, bool isPacket = false);
 
     std::string _name;
     Descriptor _file;     // empty for standard output
@@ -73,6 +83,8 @@ private:
     bool _isBegun = false; // its old content is gone
     std::uint64_t _size = 0;
     std::uint64_t _packets = 0;
+    EmbeddedDigests _digests;
+    bool _hasFailed = false;
 };
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #include "host/RecordingJournal.h"
 
 #include "host/Decompression.h"
+#include "host/EmbeddedDigests.h"
 #include "host/RecordingFile.h"
 #include "text/Format.h"
 
@@ -112,9 +113,10 @@ private:
                digestOf(packet.data) != noted.digest;
     }
 
-    /// Notes the place of every 4096th packet. Where something else than packets lies between two
-    /// such places, a reader from the middle might miss it, so then none is used. (Asking for the
-    /// position takes a system call, so it is not done for each packet.)
+    /// Notes the place of every 4096th packet. Where something else than packets, and the digests
+    /// of a recorder, lies between two such places, a reader from the middle might miss it, so then
+    /// none is used. (Asking for the position takes a system call, so it is not done for each
+    /// packet.)
     void account(const RecordedPacket& packet, std::uint64_t number) {
         const std::size_t length = packet.data.size();
         _asPcap += kPcapHeader + length;
@@ -124,7 +126,11 @@ private:
         }
         const std::uint64_t end = _recording->position().value_or(0);
         const bool isPcap = end == _position + _asPcap;
-        const bool isPcapNg = end == _position + _asPcapNg;
+        // Those of a recorder between two places.
+        constexpr std::uint64_t kDigests =
+            kPlacesEvery / EmbeddedDigests::kPacketsOfBlock * EmbeddedDigests::kBlockSize;
+        const std::uint64_t asPcapNg = _position + _asPcapNg;
+        const bool isPcapNg = end == asPcapNg || end == asPcapNg + kDigests;
         if (_journal._places.empty() || _journal._places.back().packet < number) {
             _journal._canSeek = _journal._canSeek && (number == 1 || isPcap || isPcapNg);
             const std::uint64_t size = isPcap ? kPcapHeader + length : pcapNgSize(length);

@@ -37,6 +37,13 @@ void LiveTimeline::begin(const RecordedTechnology& technology) {
     _setup.replaced();
 }
 
+void LiveTimeline::forget() {
+    _slices.stop();
+    _timeline.reset();
+    _journal.reset();
+    _technology = nullptr;
+}
+
 void LiveTimeline::finish() {
     _slices.stop();
     if (_timeline != nullptr) {

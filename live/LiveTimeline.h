@@ -42,6 +42,8 @@ public:
     /// A packet of another technology than the one before begins a new timeline. Exceptions of the
     /// resources pass through.
     void add(const RecordedTechnology& technology, Time stamp, Bytes packet);
+    /// Drops all packets.
+    void forget();
     /// Indexes what is left.
     void finish();
 

@@ -4,6 +4,7 @@
 #include "decoding/RequiredTemplates.h"
 #include "host/Complaint.h"
 #include "host/DirectoryResources.h"
+#include "host/EmbeddedDigests.h"
 #include "host/FileIdentity.h"
 #include "host/NewFile.h"
 #include "host/Snapshot.h"
@@ -125,14 +126,36 @@ std::optional<std::string> MaskCommand::maskCapture(CapturePieces& pieces,
     if (!file) {
         return unwritable(output);
     }
+    EmbeddedDigests before;
+    EmbeddedDigests after;
+    bool hasChanged = false;
     while (auto piece = pieces.next()) {
-        maskPiece(*piece, report);
+        if (piece->isSection()) {
+            before.beginSection();
+            after.beginSection();
+        }
+        const bool isPacket = piece->kind == CapturePiece::Kind::Packet;
+        if (const auto block = before.take(*piece)) {
+            const bool isRight = block->isRight && block->packets == before.packets();
+            piece->bytes = isRight ? after.block(block->isLast, piece->isBigEndian)
+                                   : after.wrongBlock(block->isLast, piece->isBigEndian);
+            hasChanged = hasChanged || !isRight;
+        } else {
+            before.add(piece->bytes, isPacket);
+            maskPiece(*piece, report);
+            after.add(piece->bytes, isPacket);
+        }
         if (!file->write(piece->bytes)) {
             return unwritable(output);
         }
     }
     if (pieces.error()) {
         return pieces.error()->sentence;
+    }
+    if (hasChanged) {
+        _environment.report(formatText("%@ has changed since it was recorded; pallax verify will "
+                                       "say so of %@, too.",
+                                       {pieces.name(), output}));
     }
     return file->finish() ? std::nullopt : std::optional(unwritable(output));
 }

@@ -1,14 +1,8 @@
 #include "masking/MaskReport.h"
 
+#include "text/Counted.h"
+
 namespace pallax {
-
-namespace {
-
-std::string counted(std::uint64_t count, const std::string& thing) {
-    return std::to_string(count) + " " + thing + (count == 1 ? "" : "s");
-}
-
-} // namespace
 
 std::string MaskReport::text(bool keepsUnknown) const {
     const std::string_view fate = keepsUnknown ? " kept" : " zeroed";

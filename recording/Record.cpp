@@ -63,7 +63,7 @@ ExitStatus record(const RecordOptions& options) {
         failure = recorder.run();
     }
     progress.leave();
-    if (const auto error = failure ? std::nullopt : (*files)->check()) {
+    if (const auto error = failure ? std::nullopt : (*files)->finish()) {
         failure = Recorder::failureText(*error, **files);
     }
     if ((*files)->tooLarge() > 0) {

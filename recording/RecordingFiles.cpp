@@ -80,6 +80,11 @@ std::optional<HostError> RecordingFiles::check() {
     return error;
 }
 
+std::optional<HostError> RecordingFiles::finish() {
+    auto error = check();
+    return error ? error : _file->finish();
+}
+
 /// Provides a file of the technology with room for the packet.
 std::optional<HostError> RecordingFiles::makeRoom(const RecordedTechnology& technology, Time time,
                                                   std::size_t length) {
@@ -111,8 +116,7 @@ bool RecordingFiles::isFull(Time time, std::size_t length) const {
     if (_stamps.isEmpty()) {
         return false;
     }
-    const bool big = _options.rotateSize &&
-                     _file->size() + PcapNgWriter::sizeOfPacket(length) > *_options.rotateSize;
+    const bool big = _options.rotateSize && _file->sizeWith(length) > *_options.rotateSize;
     const Time latest = _stamps.wouldStepBack(time) ? _stamps.latest() : time;
     return big ||
            (_options.rotateAfter && latest - _stamps.first() >= *_options.rotateAfter - _covered);
@@ -120,6 +124,9 @@ bool RecordingFiles::isFull(Time time, std::size_t length) const {
 
 /// Existing files are skipped, so that they do not end a running recording.
 std::optional<HostError> RecordingFiles::nextFile() {
+    if (auto error = _file->finish()) {
+        return error;
+    }
     std::string path;
     std::error_code unknown;
     do {

@@ -44,9 +44,10 @@ public:
     /// Nothing if the packet is in the file; otherwise an error, and recording is over. A packet
     /// above PcapNgWriter::kLargestPacket is omitted and counted.
     std::optional<HostError> add(const RecordedTechnology& technology, Time time, Bytes packet);
-    /// Nothing if the current file has not been changed by others; call this at the end too. An
-    /// error ends recording.
+    /// Nothing if the current file has not been changed by others. An error ends recording.
     std::optional<HostError> check();
+    /// Checks the current file and writes the digest that ends it. Only if nothing has failed.
+    std::optional<HostError> finish();
 
     /// Packets written to all files, except to a file that others have changed.
     std::uint64_t packets() const { return _packets; }

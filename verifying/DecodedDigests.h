@@ -1,9 +1,9 @@
 #pragma once
 
 #include "LogGenerator/Records/Sample.h"
+#include "host/Sha256.h"
 #include "timeline/FieldTable.h"
 #include "verifying/RecordingDigest.h"
-#include "verifying/Sha256.h"
 
 #include <cstdint>
 #include <map>

@@ -1,5 +1,6 @@
 #include "verifying/DigestDifference.h"
 
+#include "text/Counted.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -48,7 +49,7 @@ std::vector<std::string> differences(const RecordingDigest& before, const Record
     }
     if (before.packets != after.packets) {
         found.push_back(
-            formatText("%llu packets instead of %llu", {after.packets, before.packets}));
+            formatText("%@ instead of %llu", {counted(after.packets, "packet"), before.packets}));
     }
     const std::size_t common = std::min(before.blocks.size(), after.blocks.size());
     for (std::size_t block = 0; block < common; ++block) {

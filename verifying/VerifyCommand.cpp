@@ -10,11 +10,14 @@
 #include "host/DirectoryResources.h"
 #include "host/Files.h"
 #include "host/Snapshot.h"
+#include "text/Counted.h"
 #include "text/Format.h"
 #include "verifying/DigestDifference.h"
 #include "verifying/DigestFile.h"
 
+#include <filesystem>
 #include <unistd.h>
+#include <utility>
 
 namespace pallax {
 
@@ -51,6 +54,11 @@ ExitStatus VerifyCommand::verify(const std::string& path, Output& output) {
     if (recordingAmong(_options.recordings, regularFile(file))) {
         return couldNotTell(formatText("%@ is the recording itself.", {file}));
     }
+    const bool isEmbedded =
+        !_options.update && _options.expect.empty() && !std::filesystem::exists(file);
+    if (isEmbedded && !regularFile(path)) { // which can be read only once
+        return tell(embeddedIn(path, output), path, output);
+    }
     const auto opened = _environment.open(path);
     if (!opened) {
         return couldNotTell(opened.error().sentence);
@@ -59,6 +67,67 @@ ExitStatus VerifyCommand::verify(const std::string& path, Output& output) {
     if (snapshotOf(recording) != nullptr) {
         return couldNotTell(noTimeOfSnapshot(recording.name()).sentence);
     }
+    if (isEmbedded) {
+        return tell(embeddedIn(path, output), path, output);
+    }
+    if (regularFile(path)) {
+        const auto check = embeddedIn(path, output);
+        if (!check || !check->isSound()) {
+            return kExitFailure;
+        }
+    }
+    return compare(recording, file, output);
+}
+
+/// What the digests within the recording tell; puts out its faults.
+std::optional<EmbeddedCheck> VerifyCommand::embeddedIn(const std::string& path, Output& output) {
+    const std::string name = path == "-" ? "standard input" : path;
+    auto content = openRecordingContent({path, {}, _environment.report}, name);
+    if (!content) {
+        _environment.report(content.error().sentence);
+        return std::nullopt;
+    }
+    auto check = checkEmbeddedDigests(std::move(content).value(), name);
+    for (const std::string& fault : check.faults) {
+        output.text() += name + ": " + fault + "\n";
+        output.lineDone();
+    }
+    if (check.error) {
+        _environment.report(check.error->sentence);
+    }
+    return check;
+}
+
+/// The verdict of the digests within the recording alone.
+ExitStatus VerifyCommand::tell(const std::optional<EmbeddedCheck>& check, const std::string& path,
+                               Output& output) {
+    const std::string name = path == "-" ? "standard input" : path;
+    if (!check) {
+        return kExitCouldNotTell;
+    }
+    if (!check->isSound()) {
+        return kExitFailure;
+    }
+    if (!check->hasDigests) {
+        return couldNotTell(
+            formatText("%@ has no digests: unchanged cannot be told; --update writes some beside "
+                       "it.",
+                       {name}));
+    }
+    if (check->isWhole()) {
+        output.text() +=
+            formatText("%@: %@, whole and unchanged\n", {name, counted(check->packets, "packet")});
+        return kExitSuccess;
+    }
+    const std::uint64_t covered = check->packets - check->uncovered;
+    output.text() += formatText("%@: packets 1 to %llu are unchanged; ", {name, covered});
+    output.text() += formatText("%@ after them without a digest: the recording has no end\n",
+                                {counted(check->uncovered, "packet")});
+    return kExitCouldNotTell;
+}
+
+/// With the digests of the file, or writes them.
+ExitStatus VerifyCommand::compare(Recording& recording, const std::string& file, Output& output) {
     const auto digest = digestOf(recording, _environment.decoder);
     if (!digest) {
         _environment.report(digest.error().sentence);
@@ -88,8 +157,9 @@ ExitStatus VerifyCommand::verify(const std::string& path, Output& output) {
     if (!found.empty()) {
         return kExitFailure;
     }
-    output.text() += formatText("%@: %llu packets, as with version %@\n",
-                                {recording.name(), digest->packets, before->decoder});
+    output.text() +=
+        formatText("%@: %@, as with version %@\n",
+                   {recording.name(), counted(digest->packets, "packet"), before->decoder});
     return kExitSuccess;
 }
 

@@ -3,8 +3,10 @@
 #include "console/ExitStatus.h"
 #include "decoding/RecordingDecoder.h"
 #include "host/Recording.h"
+#include "verifying/EmbeddedCheck.h"
 
 #include <functional>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -36,6 +38,10 @@ public:
 
 private:
     ExitStatus verify(const std::string& path, Output& output);
+    std::optional<EmbeddedCheck> embeddedIn(const std::string& path, Output& output);
+    ExitStatus tell(const std::optional<EmbeddedCheck>& check, const std::string& path,
+                    Output& output);
+    ExitStatus compare(Recording& recording, const std::string& file, Output& output);
     ExitStatus couldNotTell(const std::string& sentence);
 
     VerifyOptions _options;

@@ -61,6 +61,10 @@ TEST_F(EndToEndMask, WrongUsageIsOneSentence) {
     const Run nothing = run({"mask", "x.pcap"});
     EXPECT_EQ(nothing.status, 2);
     EXPECT_EQ(nothing.err, "pallax: --output or --check is required (see pallax mask --help)\n");
+    const Run output = run({"mask", "x.pcap", "-o", "-"});
+    EXPECT_EQ(output.status, 2);
+    EXPECT_EQ(output.err, "pallax: a masked copy is a file, not standard output (see pallax mask "
+                          "--help)\n");
     const Run unknown = run({"mask", "--also", "nose", attachWithSim(), "-o", "y"});
     EXPECT_EQ(unknown.status, 2);
     EXPECT_EQ(unknown.err, "pallax: No field is named \"nose\" (see pallax fields).\n");

@@ -63,6 +63,45 @@ TEST_F(EndToEndSafe, NoKeyShowsFindsOrSavesAnIdentity) {
     EXPECT_EQ(run({"mask", "--check", saved.front()}).status, 0);
 }
 
+TEST_F(EndToEndSafe, AKeyHidesIdentitiesAndShowsThemAgain) {
+    PallaxTerminal terminal(world, {withSim(), "--speed", "max"}, {});
+    const auto openSim = [&] {
+        ASSERT_TRUE(terminal.shows("End of the recording"));
+        terminal.type("/sim info\r");
+        ASSERT_TRUE(terminal.shows("1 of 26"));
+        terminal.type("\r");
+        ASSERT_TRUE(terminal.shows("Pallax › SIM Info"));
+    };
+    openSim();
+    ASSERT_TRUE(terminal.shows(kIccid));
+    terminal.type("x");
+    ASSERT_TRUE(terminal.showsNoMore(kIccid));
+    ASSERT_TRUE(terminal.shows("safe"));
+    openSim();
+    ASSERT_TRUE(terminal.shows("0000000000000000000"));
+    terminal.type(",");
+    ASSERT_TRUE(terminal.shows("held"));
+    ASSERT_TRUE(terminal.shows("0000000000000000000"));
+    EXPECT_TRUE(terminal.showsNoMore(kIccid));
+    terminal.type(";select count(*) as found from sample where text like '8949%'\r");
+    ASSERT_TRUE(terminal.shows("1 row"));
+    EXPECT_TRUE(terminal.showsNoMore("89490"));
+    terminal.type(std::string(kEscape) + "x");
+    ASSERT_TRUE(terminal.showsNoMore("safe"));
+    openSim();
+    EXPECT_TRUE(terminal.shows(kIccid));
+}
+
+TEST_F(EndToEndSafe, NoKeyUndoesTheOption) {
+    PallaxTerminal terminal(world, {withSim(), "--safe", "--speed", "max"}, {});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    ASSERT_TRUE(terminal.shows("safe"));
+    terminal.type("x");
+    EXPECT_TRUE(terminal.shows("The viewer was started with --safe and stays so."));
+    terminal.type("j");
+    EXPECT_TRUE(terminal.shows("safe"));
+}
+
 TEST_F(EndToEndSafe, WithoutItTheIdentityIsShown) {
     const Run open = run({withSim(), "--print", "--speed", "max"});
     EXPECT_NE(open.out.find(std::string("EF-ICCID: ") + kIccid), std::string::npos);

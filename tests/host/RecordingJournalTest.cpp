@@ -1,5 +1,6 @@
 #include "host/RecordingJournal.h"
 
+#include "host/PcapNgWriter.h"
 #include "host/RecordingWriter.h"
 #include "tests/doubles/Compression.h"
 #include "tests/doubles/Files.h"
@@ -233,6 +234,26 @@ TEST_F(RecordingJournalTest, APcapngFileIsReadFromTheMiddleToo) {
     }
     path = folder.write("drive.pcapng", file.bytes);
     expectAnyStart(*opened());
+}
+
+TEST_F(RecordingJournalTest, TheDigestsOfARecorderDoNotKeepItFromTheMiddle) {
+    {
+        const auto writer = PcapNgWriter::create(path, PcapNgWriter::Existing::Overwrite);
+        ASSERT_FALSE((*writer)->begin(150, "Zorell_LTE"));
+        for (std::uint64_t number = 1; number <= kCount; ++number) {
+            ASSERT_FALSE((*writer)->write(timeOf(number), contentOf(number)));
+        }
+        ASSERT_FALSE((*writer)->finish());
+    }
+    const auto journal = opened();
+    expectAnyStart(*journal);
+    expectAnyStart(*journal);
+    // Who reads from the start now comes to nothing.
+    constexpr std::size_t kLengthOfFirst = 92 + 4;
+    std::string content = doubles::contentOf(path);
+    content[kLengthOfFirst] ^= 1;
+    folder.write("drive.pcap", content);
+    EXPECT_EQ(readAll(*journal->reader(9000), 9000), kCount - 8999);
 }
 
 TEST_F(RecordingJournalTest, WhatStandsBetweenThePacketsOfAPcapngFileIsNotMissed) {

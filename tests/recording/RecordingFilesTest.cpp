@@ -15,7 +15,7 @@ namespace {
 using std::chrono::seconds;
 
 constexpr Time kPacketTime{seconds(1700000000)};
-constexpr std::size_t kEmptyFile = 92; // section and interface
+constexpr std::size_t kEmptyFile = 92 + EmbeddedDigests::kBlockSize; // section, interface, end
 
 class RecordingFilesTest : public testing::Test {
 protected:

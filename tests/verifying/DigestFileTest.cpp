@@ -1,7 +1,7 @@
 #include "verifying/DigestFile.h"
 
+#include "host/Sha256.h"
 #include "tests/doubles/Property.h"
-#include "verifying/Sha256.h"
 
 #include <gtest/gtest.h>
 

@@ -70,7 +70,11 @@ TEST_F(VerifyCommandTest, ARecordingIsWhatItWasAfterAnUpdate) {
 TEST_F(VerifyCommandTest, WithoutDigestsItCannotTell) {
     const std::string drive = copyOf("lte-drive.pcap");
     EXPECT_EQ(verify({.recordings = {drive}}), kExitCouldNotTell);
-    EXPECT_EQ(reports, std::vector<std::string>{digestFileOf(drive) +
+    EXPECT_EQ(reports,
+              std::vector<std::string>{drive + " has no digests: unchanged cannot be told; "
+                                               "--update writes some beside it."});
+    EXPECT_EQ(verify({.recordings = {drive}, .expect = folder.path("missing")}), kExitCouldNotTell);
+    EXPECT_EQ(reports, std::vector<std::string>{folder.path("missing") +
                                                 " cannot be read: No such file or directory; "
                                                 "--update writes it."});
     (void)folder.write("drive.pcap.pallax-verify", "nothing");

@@ -46,7 +46,9 @@ int Bars::drawOrigin(int right, int columns) {
     if (columnsOf(time) > columns) {
         time = time.substr(0, time.find(','));
     }
-    for (const std::string& notice : {time, _status.stream, alarmText(_status.alarms, right / 2)}) {
+    const std::string safe = _status.isSafe ? "safe" : "";
+    for (const std::string& notice :
+         {safe, time, _status.stream, alarmText(_status.alarms, right / 2)}) {
         if (!notice.empty()) {
             const int left = std::max(right - columnsOf(notice), kMargin);
             _grid.put(left, kTitleRow, notice, {.bold = true}, {kMargin, right});

@@ -62,6 +62,7 @@ struct PaneStatus {
     std::string oldValues; ///< the time of values that are no longer updated
     std::string stream;    ///< why nothing changes; in the title
     std::vector<std::string> alarms; ///< the names of those that are true; in the title
+    bool isSafe = false;             ///< nothing that identifies a person is shown; in the title
     std::string zone;                ///< for the time in the status text
     std::function<void(const KeyEvent&)> press = [](const KeyEvent&) {}; ///< by a click
     /// What the value at a path of the display says about itself: "out of range", or nothing.

@@ -81,6 +81,7 @@ void FrontEnd::drawScreen(Grid& grid, TerminalNavigation& navigation) {
                             .oldValues = _time.isAway() ? std::string() : _oldValues,
                             .stream = _stream,
                             .alarms = _alarms,
+                            .isSafe = _isSafe,
                             .zone = _surroundings.zone(),
                             .press = [this](const KeyEvent& event) { handle(event); },
                             .standing = [this](const auto& path) { return standingOfRow(path); },
@@ -109,6 +110,25 @@ void FrontEnd::openQuery() {
     _pages.open(QueryPage({_surroundings.moment, _surroundings.goTo, _surroundings.mayGoOn,
                            _surroundings.queries, _surroundings.ahead, _marks,
                            [this](const std::string& text) { copy(text); }}));
+    needsDisplay();
+}
+
+void FrontEnd::forgetTimeline() {
+    _shown.forget();
+    _finder.forget();
+    _time.forget();
+}
+
+void FrontEnd::setSafe(bool isSafe) {
+    _isSafe = isSafe;
+    forgetTimeline();
+    _pages = {};
+    _graph = {};
+    _search.reset();
+    _filterEditor.reset();
+    if (TerminalTable* const pane = table()) {
+        pane->setFilter("");
+    }
     needsDisplay();
 }
 
@@ -250,6 +270,8 @@ void FrontEnd::handlePage(const KeyEvent& event) {
     if (character == U'q') {
         _pages.closeTop();
         needsDisplay();
+    } else if (character == U'x') {
+        _surroundings.switchSafe();
     } else if (character == U'?' || character == U'R' || character == U'V') {
         handlePaneCharacter(character);
     }

@@ -66,6 +66,8 @@ public:
         std::function<void(std::size_t number)> chooseModem = [](std::size_t /*number*/) {};
         /// Judges levels.
         std::function<const QualityProfile&()> profile = ShownValues::Source().profile;
+        /// Hides what identifies a person, or shows it again.
+        std::function<void()> switchSafe = [] {};
 
         ShownValues::Source valueSource() const;
     };
@@ -89,7 +91,10 @@ public:
     void showListsAsTables(bool asTables) { _toolkit.lists().asTables = asTables; }
 
     /// The timeline is another one: what is known of the old one is forgotten.
-    void forgetTimeline() { _shown.forget(); }
+    void forgetTimeline();
+    /// Whether nothing that identifies a person is shown. What was shown, found or typed is
+    /// forgotten; whoever calls it starts afresh.
+    void setSafe(bool isSafe);
 
     /// Replaces the status text until the next key.
     void setMessage(std::string message);
@@ -186,6 +191,7 @@ private:
     std::string _stream;
     std::vector<std::string> _alarms;
     std::string _oldValues;
+    bool _isSafe = false;
     std::size_t _spinnerTurn = 0;
 };
 

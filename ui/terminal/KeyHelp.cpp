@@ -39,6 +39,7 @@ constexpr auto kKeyHelp = std::to_array<KeyHelp>({
     {"( )", "play slower or faster", kPanes | kPages},
     {"s", "save a snapshot", kPanes},
     {"y", "copy the value", kPanes},
+    {"x", "safe: hide identities, or back", kPanes | kPages},
     {"R", "reconnect, drop old values", kPanes | kPages},
     {"1-9", "one of several modems", kModems},
     {"Ctrl-N", "the next of several modems", kModems},

@@ -76,6 +76,8 @@ void FrontEnd::handlePaneCharacter(char32_t character) {
         return needsDisplay();
     case U'R':
         return _surroundings.startAfresh();
+    case U'x': // hides a column where there are columns
+        return pane.list() == nullptr ? _surroundings.switchSafe() : pane.handleListKey(character);
     case U'q':
         return navigation()->isAtRoot() ? _surroundings.quit() : navigation()->back();
     case U't':

@@ -18,9 +18,9 @@ TextFinder::Instants TextFinder::instants(const std::string& text) {
     if (text.empty() || timeline == nullptr) {
         return found;
     }
-    found.isStopped = !_appearances.read(*timeline, _surroundings.mayGoOn);
-    found.isFull = _appearances.isFull();
-    found.hits = _appearances.find(*timeline, [&text](std::string_view each) {
+    found.isStopped = !_appearances->read(*timeline, _surroundings.mayGoOn);
+    found.isFull = _appearances->isFull();
+    found.hits = _appearances->find(*timeline, [&text](std::string_view each) {
         return findIgnoringCase(each, text) != std::string_view::npos;
     });
     return found;

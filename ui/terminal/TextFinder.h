@@ -6,6 +6,7 @@
 
 #include <cstddef>
 #include <functional>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -40,10 +41,12 @@ public:
     };
     /// In the whole recording; nothing for the empty text.
     Instants instants(const std::string& text);
+    /// The timeline is another one.
+    void forget() { _appearances.emplace(); }
 
 private:
     Surroundings _surroundings;
-    Appearances _appearances;
+    std::optional<Appearances> _appearances{std::in_place};
 };
 
 } // namespace pallax::terminal

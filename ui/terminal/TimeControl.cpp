@@ -118,6 +118,14 @@ void TimeControl::handleTyping(const KeyEvent& event) {
     _surroundings.needsDisplay();
 }
 
+void TimeControl::forget() {
+    _typed.reset();
+    _panes.reset();
+    _walk.reset();
+    _compared.reset();
+    _changes = {};
+}
+
 std::optional<Prompt> TimeControl::prompt() const {
     return _typed ? std::optional(Prompt{":", &*_typed, kLeavePrompt}) : std::nullopt;
 }

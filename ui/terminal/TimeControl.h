@@ -44,6 +44,9 @@ public:
     /// What has changed since the mark.
     const ChangesPage::Content& changes();
 
+    /// The timeline is another one.
+    void forget();
+
     bool hasMark() const { return travel() != nullptr && travel()->marked().has_value(); }
 
 private:

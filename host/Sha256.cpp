@@ -1,6 +1,5 @@
-#include "verifying/Sha256.h"
+#include "host/Sha256.h"
 
-#include <array>
 #include <openssl/evp.h>
 #include <stdexcept>
 
@@ -39,16 +38,19 @@ Sha256& Sha256::add(std::string_view text) {
     return *this;
 }
 
+Sha256::Digest Sha256::finishBytes() {
+    Digest digest{};
+    require(EVP_DigestFinal_ex(_state.get(), digest.data(), nullptr) == 1);
+    begin();
+    return digest;
+}
+
 std::string Sha256::finish() {
     constexpr std::string_view kDigits = "0123456789abcdef";
     constexpr unsigned kHalfBits = 4;
     constexpr unsigned kHalf = 0xF;
-    std::array<std::uint8_t, EVP_MAX_MD_SIZE> digest{};
-    unsigned size = 0;
-    require(EVP_DigestFinal_ex(_state.get(), digest.data(), &size) == 1);
-    begin();
     std::string text;
-    for (const std::uint8_t byte : std::span(digest).first(size)) {
+    for (const std::uint8_t byte : finishBytes()) {
         text += kDigits[byte >> kHalfBits];
         text += kDigits[byte & kHalf];
     }

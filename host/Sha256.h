@@ -2,6 +2,8 @@
 
 #include "text/Bytes.h"
 
+#include <array>
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -14,10 +16,14 @@ namespace pallax {
 /// A SHA-256 that is being computed.
 class Sha256 {
 public:
+    using Digest = std::array<std::uint8_t, 32>;
+
     Sha256();
     Sha256& add(Bytes bytes);
     Sha256& add(std::string_view text);
-    /// The digest of what was added, as 64 hexadecimal digits; a new one begins.
+    /// The digest of what was added; a new one begins.
+    Digest finishBytes();
+    /// The same as 64 hexadecimal digits.
     std::string finish();
 
 private:
