@@ -210,7 +210,9 @@ TEST_F(EventsTest, EveryFieldOfTheTableExistsAndSoDoItsLabels) {
         for (const std::string_view name : row.fields) {
             ASSERT_TRUE(fields.named(name)) << name;
             const FieldInfo& info = fields[*fields.named(name)];
-            const bool hasLabels = name == row.fields.front();
+            // Not all texts of an object stream are listed.
+            const bool isListed = row.technology != "ifx" || !info.labels.empty();
+            const bool hasLabels = name == row.fields.front() && isListed;
             for (const auto labels : {row.good, row.bad}) {
                 for (const std::string_view label : hasLabels ? labels : decltype(labels)()) {
                     EXPECT_NE(std::find(info.labels.begin(), info.labels.end(), label),

@@ -108,9 +108,9 @@ TEST_F(FrontEndAlertTest, AnAlertLiesOverTheHelpPageToo) {
     stage.type("?");
     stage.frontEnd.resize(40, 12);
     alert();
-    EXPECT_EQ(stage.line(4), " Ph┌ File Error ────────────────────┐4");
+    EXPECT_EQ(stage.line(4), " P│┌ File Error ────────────────────┐4");
     stage.press(Key::Enter);
-    EXPECT_EQ(stage.line(0), " Pa┌ Keys ──────────────────────────┐");
+    EXPECT_EQ(stage.line(0), " P┌ Keys ───────────────────────────┐");
 }
 
 TEST_F(FrontEndAlertTest, SeveralAlertsAreClosedOneByOne) {

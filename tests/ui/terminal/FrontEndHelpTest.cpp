@@ -25,66 +25,66 @@ TEST_F(FrontEndHelpTest, TheHelpPageLiesOverThePane) {
  Pallax › Serving Cell Measurements
  ──────────────────────────────────────────────────────────────────────────────
 ▌Version                                                                     1
- E-ARFCN      ┌ Keys ───────────────────────────────────────────┐         1850
- Physical Cell│ Up Down  k j      one row up or down            │          274
- Measured RSRP│ PgUp PgDn         one page up or down           │   -94.75 dBm
- Average RSRP │ Home End  g G     first or last row             │   -95.00 dBm
- Measured RSRQ│ Enter Right l     open the row                  │     -9.50 dB
-              │ Right Left  l h   scroll a long row             │
-              │ Left h Backspace  back                          │
-              │ Esc               clear the filter, or back     │
-              │ /                 filter rows by name or value  │
-              │ f                 find a text in all values     │
-              │ t                 a list as a table or as rows  │
-              │ < > r  x X        sort a table; hide columns    │
-              │ o                 overview of the radio         │
-              │ e ;               events; ask in SQL            │
-              │ i Enter           all about the value           │
-              │ v V               put it in the graph; open it  │
-              │ Space             hold time; play on from there │
-              │ , .               one tick back or forward      │
-              │ [ ]               to the event before or after  │
-              │ { }               one minute back or forward    │
-              │ ^ $               to the start; present or end  │
-              │ :                 go to a time or a condition   │
-              │ n N               next or previous place found  │
-              │ m d               mark; changes since the mark  │
-              │ ( )               play slower or faster         │
-              │ s                 save a snapshot               │
-              │ y                 copy the value                │
-              │ R                 reconnect, drop old values    │
-              │ Click, wheel      open; scroll; drag time bar   │
-              │ Ctrl-L            redraw the screen             │
-              │ Ctrl-Z            suspend; fg resumes           │
-              │ ?                 all keys                      │
-              │ q                 back; at the first pane, quit │
-              │ Ctrl-C            quit                          │
-              └─────────────────────────────────────────────────┘
-
+ E-ARFCN      ┌ Keys ────────────────────────────────────────────┐        1850
+ Physical Cell│ Up Down  k j      one row up or down             │         274
+ Measured RSRP│ PgUp PgDn         one page up or down            │  -94.75 dBm
+ Average RSRP │ Home End  g G     first or last row              │  -95.00 dBm
+ Measured RSRQ│ Enter Right l     open the row                   │    -9.50 dB
+              │ Right Left  l h   scroll a long row              │
+              │ Left h Backspace  back                           │
+              │ Esc               clear the filter, or back      │
+              │ /                 filter rows by name or value   │
+              │ f                 find a text in all values      │
+              │ t                 a list as a table or as rows   │
+              │ < > r  x X        sort a table; hide columns     │
+              │ o                 overview of the radio          │
+              │ e ;               events; ask in SQL             │
+              │ i Enter           all about the value            │
+              │ v V               put it in the graph; open it   │
+              │ Space             hold time; play on from there  │
+              │ , .               one tick back or forward       │
+              │ [ ]               to the event before or after   │
+              │ { }               one minute back or forward     │
+              │ ^ $               to the start; present or end   │
+              │ :                 go to a time or a condition    │
+              │ n N               next or previous place found   │
+              │ m d               mark; changes since the mark   │
+              │ ( )               play slower or faster          │
+              │ s                 save a snapshot                │
+              │ y                 copy the value                 │
+              │ x                 safe: hide identities, or back │
+              │ R                 reconnect, drop old values     │
+              │ Click, wheel      open; scroll; drag time bar    │
+              │ Ctrl-L            redraw the screen              │
+              │ Ctrl-Z            suspend; fg resumes            │
+              │ ?                 all keys                       │
+              │ q                 back; at the first pane, quit  │
+              │ Ctrl-C            quit                           │
+              └──────────────────────────────────────────────────┘
 
  ──────────────────────────────────────────────────────────────────────────────
  Updated 2023-11-14 at 22:13:20                        / filter  s Save  ? help
 )");
     EXPECT_EQ(stage.screen(40, 12), R"(
- Pa┌ Keys ──────────────────────────┐
- ──│ Up Down  k j                   │──
-▌Ve│  one row up or down            │1
- E-│ PgUp PgDn                      │0
- Ph│  one page up or down           │4
- Me│ Home End  g G                  │m
- Av│  first or last row             │m
- Me│ Enter Right l                  │B
-   │  open the row                  │
-   │ Right Left  l h                │
- ──│  scroll a long row             │──
- Up└───────────────────────── ↓ 56 ─┘lp
+ P┌ Keys ───────────────────────────┐
+ ─│ Up Down  k j                    │──
+▌V│  one row up or down             │1
+ E│ PgUp PgDn                       │0
+ P│  one page up or down            │4
+ M│ Home End  g G                   │m
+ A│  first or last row              │m
+ M│ Enter Right l                   │B
+  │  open the row                   │
+  │ Right Left  l h                 │
+ ─│  scroll a long row              │──
+ U└────────────────────────── ↓ 58 ─┘lp
 )");
     EXPECT_EQ(stage.screen(20, 5), R"(
 ┌ Keys ────────────┐
 │ Up Down  k j     │
 │  one row up or   │
 │  down            │
-└─────────── ↓ 93 ─┘
+└─────────── ↓ 97 ─┘
 )");
 }
 
