@@ -1,5 +1,5 @@
-// A packet of any bytes, of each technology: masking never fails, keeps the length unless a property
-// list is written anew, and what it leaves is masked once and for all.
+// A packet of any bytes, of each technology: masking never fails, keeps the length unless a
+// property list is written anew, and what it leaves is masked once and for all.
 
 #include "LogGenerator/LogPacket.h"
 #include "host/DirectoryResources.h"

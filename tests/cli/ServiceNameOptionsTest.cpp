@@ -24,9 +24,10 @@ TEST(Options, AServiceCanHaveAName) {
         arguments.insert(arguments.end(), further.begin(), further.end());
         EXPECT_EQ(ended(arguments).status, kExitWrongUsage) << further.front();
     }
-    EXPECT_EQ(ended({"service", "--name", "car1"}).text,
-              "pallax: the service needs --play, --simulate, --relay, --modem, --status or --list (see "
-              "pallax service --help)\n");
+    EXPECT_EQ(
+        ended({"service", "--name", "car1"}).text,
+        "pallax: the service needs --play, --simulate, --relay, --modem, --status or --list (see "
+        "pallax service --help)\n");
 }
 
 TEST(Options, CommandsAboutTheLiveModemCanNameItsService) {
