@@ -13,15 +13,14 @@ constexpr std::uint32_t kLocalBlock = 0x80000BAD; // of the range for local use
 constexpr std::uint32_t kMaker = 32473;
 constexpr std::string_view kName = "pallaxd1";
 constexpr std::size_t kBodyAt = 8; // in the block
-constexpr std::size_t kNameAt = kBodyAt + 4;
 constexpr std::size_t kPacketsAt = kBodyAt + 12;
 constexpr std::size_t kLastAt = kBodyAt + 20;
 constexpr std::size_t kDigestAt = kBodyAt + 24;
-constexpr std::size_t kLengthAt = kDigestAt + sizeof(Sha256::Digest);
+constexpr std::size_t kTrailerAt = kDigestAt + sizeof(Sha256::Digest);
 constexpr std::size_t kWordSize = 4;
 constexpr unsigned kBitsOfByte = 8;
 
-static_assert(kLengthAt + kWordSize == EmbeddedDigests::kBlockSize);
+static_assert(kTrailerAt + kWordSize == EmbeddedDigests::kBlockSize);
 
 void put(ByteBuffer& bytes, std::uint64_t number, std::size_t width, bool isBigEndian = false) {
     for (std::size_t index = 0; index < width; ++index) {

@@ -46,13 +46,13 @@ Sha256::Digest Sha256::finishBytes() {
 }
 
 std::string Sha256::finish() {
-    constexpr std::string_view kDigits = "0123456789abcdef";
+    constexpr std::string_view kHexDigits = "0123456789abcdef";
     constexpr unsigned kHalfBits = 4;
     constexpr unsigned kHalf = 0xF;
     std::string text;
     for (const std::uint8_t byte : finishBytes()) {
-        text += kDigits[byte >> kHalfBits];
-        text += kDigits[byte & kHalf];
+        text += kHexDigits[byte >> kHalfBits];
+        text += kHexDigits[byte & kHalf];
     }
     return text;
 }

@@ -89,7 +89,7 @@ std::optional<EmbeddedCheck> VerifyCommand::embeddedIn(const std::string& path, 
     }
     auto check = checkEmbeddedDigests(std::move(content).value(), name);
     for (const std::string& fault : check.faults) {
-        output.text() += name + ": " + fault + "\n";
+        output.text().append(name).append(": ").append(fault).append("\n");
         output.lineDone();
     }
     if (check.error) {

@@ -20,9 +20,9 @@ protected:
         return world.path(name);
     }
     /// A recording that `pallax record` has made of so many packets.
-    std::string recorded(int count, std::vector<std::string> options = {}) const {
+    std::string recorded(unsigned count, std::vector<std::string> options = {}) const {
         std::vector<Packet> packets;
-        for (int index = 0; index < count; ++index) {
+        for (unsigned index = 0; index < count; ++index) {
             packets.emplace_back(std::chrono::milliseconds(10) * index, registration(index % 3));
         }
         doubles::PallaxProcess service(

@@ -48,7 +48,7 @@ protected:
 };
 
 TEST_F(EmbeddedCheckTest, ARecordingThatWasEndedIsWhole) {
-    for (const std::uint64_t packets : {1, 1023, 1024, 1025, 2500}) {
+    for (const std::uint64_t packets : {1U, 1023U, 1024U, 1025U, 2500U}) {
         const EmbeddedCheck found = check(record(packets));
         EXPECT_TRUE(found.isWhole()) << packets;
         EXPECT_EQ(found.packets, packets);
