@@ -20,7 +20,7 @@
 #include "host/Snapshot.h"
 #include "link/Settings.h"
 #include "telephony/ChildService.h"
-#include "ui/terminal/TerminalRestorer.h"
+#include "ui/curses/TerminalRestorer.h"
 
 #include <algorithm>
 #include <memory>

@@ -2,7 +2,7 @@
 
 #include "sources/Source.h"
 #include "telephony/PacketPlayer.h"
-#include "ui/terminal/CursesTerminal.h"
+#include "ui/curses/CursesTerminal.h"
 
 #include <cstddef>
 #include <optional>

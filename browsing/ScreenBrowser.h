@@ -1,7 +1,7 @@
 #pragma once
 
 #include "browsing/ScreenSession.h"
-#include "ui/terminal/CursesTerminal.h"
+#include "ui/curses/CursesTerminal.h"
 #include "ui/terminal/SplitScreen.h"
 
 #include <chrono>

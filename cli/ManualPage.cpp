@@ -2,7 +2,7 @@
 
 #include "cli/HelpText.h"
 #include "text/Roff.h"
-#include "ui/terminal/KeyHelp.h"
+#include "ui/pages/KeyHelp.h"
 
 #include <utility>
 

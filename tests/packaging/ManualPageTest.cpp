@@ -6,7 +6,7 @@
 #include "tests/doubles/Files.h"
 #include "tests/doubles/Pattern.h"
 #include "tests/doubles/Shell.h"
-#include "ui/terminal/KeyHelp.h"
+#include "ui/pages/KeyHelp.h"
 
 #include <gtest/gtest.h>
 

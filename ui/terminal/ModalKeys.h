@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ui/terminal/Keys.h"
+#include "ui/drawing/Keys.h"
 #include "ui/terminal/ModalView.h"
 
 #include <functional>

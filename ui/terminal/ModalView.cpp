@@ -1,7 +1,7 @@
 #include "ui/terminal/ModalView.h"
 
+#include "ui/drawing/TextWidth.h"
 #include "ui/terminal/TerminalToolkit.h"
-#include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
 #include <memory>

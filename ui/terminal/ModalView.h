@@ -1,8 +1,8 @@
 #pragma once
 
 #include "platform/ui/ModalScreen.h"
-#include "ui/terminal/Box.h"
-#include "ui/terminal/HitMap.h"
+#include "ui/drawing/Box.h"
+#include "ui/drawing/HitMap.h"
 
 namespace pallax::terminal {
 

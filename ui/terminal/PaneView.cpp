@@ -1,9 +1,9 @@
 #include "ui/terminal/PaneView.h"
 
 #include "text/AgeText.h"
-#include "ui/terminal/MarkedText.h"
+#include "ui/drawing/MarkedText.h"
+#include "ui/drawing/TextWidth.h"
 #include "ui/terminal/TerminalToolkit.h"
-#include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
 #include <array>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ui/terminal/Bars.h"
+#include "ui/drawing/Bars.h"
 #include "ui/terminal/TerminalNavigation.h"
 #include "ui/terminal/TerminalTable.h"
 

@@ -1,7 +1,7 @@
 #include "ui/terminal/SplitScreen.h"
 
+#include "ui/drawing/TextWidth.h"
 #include "ui/terminal/FrontEnd.h"
-#include "ui/terminal/TextWidth.h"
 
 #include <algorithm>
 #include <utility>

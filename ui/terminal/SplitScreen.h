@@ -1,9 +1,9 @@
 #pragma once
 
-#include "ui/terminal/Grid.h"
-#include "ui/terminal/HitMap.h"
-#include "ui/terminal/Keys.h"
-#include "ui/terminal/Marks.h"
+#include "ui/drawing/Grid.h"
+#include "ui/drawing/HitMap.h"
+#include "ui/drawing/Keys.h"
+#include "ui/drawing/Marks.h"
 
 #include <cstddef>
 #include <functional>

@@ -1,6 +1,6 @@
 #include "ui/terminal/TerminalMetrics.h"
 
-#include "ui/terminal/TextWidth.h"
+#include "ui/drawing/TextWidth.h"
 
 namespace pallax::terminal {
 

@@ -3,7 +3,7 @@
 #include "app/pane/PaneModel.h"
 #include "app/table/ListTable.h"
 #include "platform/ui/TableView.h"
-#include "ui/terminal/ColumnTable.h"
+#include "ui/drawing/ColumnTable.h"
 
 #include <cstddef>
 #include <functional>

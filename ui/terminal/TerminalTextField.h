@@ -1,7 +1,7 @@
 #pragma once
 
 #include "platform/ui/TextField.h"
-#include "ui/terminal/LineEditor.h"
+#include "ui/drawing/LineEditor.h"
 
 #include <functional>
 

@@ -3,9 +3,9 @@
 #include "app/HeldPanes.h"
 #include "timeline/FrameWalk.h"
 #include "travel/Travel.h"
-#include "ui/terminal/Bars.h"
-#include "ui/terminal/ChangesPage.h"
-#include "ui/terminal/LineEditor.h"
+#include "ui/drawing/Bars.h"
+#include "ui/drawing/LineEditor.h"
+#include "ui/pages/ChangesPage.h"
 #include "ui/terminal/TerminalNavigation.h"
 
 #include <cstdint>

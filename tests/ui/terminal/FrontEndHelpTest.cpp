@@ -1,5 +1,5 @@
 #include "tests/ui/terminal/StageFixture.h"
-#include "ui/terminal/Overlays.h"
+#include "ui/pages/Overlays.h"
 
 #include <gtest/gtest.h>
 

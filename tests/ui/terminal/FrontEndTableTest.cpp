@@ -1,4 +1,4 @@
-#include "tests/ui/terminal/SampleDisplay.h"
+#include "tests/ui/pages/SampleDisplay.h"
 #include "tests/ui/terminal/StageFixture.h"
 
 #include <gtest/gtest.h>

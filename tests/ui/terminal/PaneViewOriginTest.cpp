@@ -1,6 +1,6 @@
 #include "tests/ui/terminal/StageFixture.h"
-#include "ui/terminal/Origin.h"
-#include "ui/terminal/TextWidth.h"
+#include "ui/drawing/Origin.h"
+#include "ui/drawing/TextWidth.h"
 
 #include <gtest/gtest.h>
 

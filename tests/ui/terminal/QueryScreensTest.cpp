@@ -1,4 +1,4 @@
-#include "tests/ui/terminal/SampleTimeline.h"
+#include "tests/ui/pages/SampleTimeline.h"
 #include "tests/ui/terminal/StageFixture.h"
 
 #include <gtest/gtest.h>

@@ -1,7 +1,7 @@
 #include "ui/terminal/SplitScreen.h"
 
 #include "tests/doubles/Property.h"
-#include "tests/ui/terminal/GridSupport.h"
+#include "tests/ui/drawing/GridSupport.h"
 #include "tests/ui/terminal/StageData.h"
 #include "tests/ui/terminal/TerminalStage.h"
 

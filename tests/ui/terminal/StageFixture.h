@@ -1,6 +1,6 @@
 #pragma once
 
-#include "tests/ui/terminal/GridSupport.h"
+#include "tests/ui/drawing/GridSupport.h"
 #include "tests/ui/terminal/StageData.h"
 #include "tests/ui/terminal/TerminalStage.h"
 

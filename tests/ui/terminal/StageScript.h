@@ -1,9 +1,9 @@
 #pragma once
 
-#include "tests/ui/terminal/GridSupport.h"
+#include "tests/ui/drawing/GridSupport.h"
 #include "tests/ui/terminal/StageData.h"
 #include "tests/ui/terminal/TerminalStage.h"
-#include "ui/terminal/CursesKeys.h"
+#include "ui/curses/CursesKeys.h"
 
 #include <array>
 #include <cstdint>

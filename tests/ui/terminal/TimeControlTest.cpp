@@ -1,5 +1,5 @@
 #include "tests/timeline/TimelineFixture.h"
-#include "tests/ui/terminal/GridSupport.h"
+#include "tests/ui/drawing/GridSupport.h"
 #include "tests/ui/terminal/TerminalStage.h"
 #include "ui/terminal/SplitScreen.h"
 

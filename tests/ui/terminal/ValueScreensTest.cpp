@@ -1,4 +1,4 @@
-#include "tests/ui/terminal/ValueStage.h"
+#include "tests/ui/pages/ValueStage.h"
 
 #include <gtest/gtest.h>
 
