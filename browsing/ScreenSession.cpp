@@ -2,6 +2,7 @@
 
 #include "host/BoundedJournal.h"
 #include "host/KnowledgeFiles.h"
+#include "host/Snapshot.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
 #include "platform/ZoneText.h"
@@ -18,7 +19,7 @@ ScreenSession::ScreenSession(const Screen& screen, Shown shown)
     : _screen(screen), _name(sourceName(shown.source)), _isReadOnce(isReadOnce(shown.source)),
       _link(screen.queue, std::move(shown.directory), screen.onFatalRecord, shown.child,
             screen.notices),
-      _safe(_link.resources()), _watch(_link.resources()),
+      _safe(_link.resources()), _watch(_link.resources()), _snapshot(_link.resources()),
       _timeline({.link = _link,
                  .source = shown.source,
                  .journal = screen.settings.journal,
@@ -143,8 +144,7 @@ BrowsingSession::Surroundings ScreenSession::sessionSurroundings(bool isReadOnce
                 [this](ModelObserver& observer) {
                     auto model = std::make_unique<PallaxModel>(_link.platform(), observer);
                     model->addSampleSink(_watch);
-                    model->onPacket(
-                        [this](Bytes packet, Time time) { _timeline.add(packet, time); });
+                    model->onPacket([this](Bytes packet, Time time) { take(packet, time); });
                     return model;
                 },
             .face = {.message = [this](const auto& text) { _frontEnd.setMessage(text); },
@@ -172,11 +172,20 @@ EntryPart ScreenSession::entryPart(const std::string& path) const {
 
 void ScreenSession::begin(const std::string& technology) {
     _alarms.begin(nullptr); // the values end
+    _isSnapshot = technology == kSnapshotTechnology.identifier;
     _safe.begin(technology);
     _watch.begin(technology);
     _timeline.begin(technology);
     _alarms.begin(_watch.values());
     _frontEnd.setAlarms({});
+}
+
+void ScreenSession::take(Bytes packet, Time time) {
+    if (_isSnapshot) {
+        _snapshot.take(packet, time);
+    } else {
+        _timeline.add(packet, time);
+    }
 }
 
 /// Comes also while there are no packets, when ages grow.
@@ -255,8 +264,9 @@ const NetworkNames& ScreenSession::names() {
 
 Overview ScreenSession::overview() {
     const Time now = _link.clock().now();
-    Overview overview = _travel.isAway() ? overviewAt(_travel.moment(), names(), _screen.profile)
-                                         : _watch.overview(now, names(), _screen.profile);
+    Overview overview = _isSnapshot        ? _snapshot.overview(names(), _screen.profile)
+                        : _travel.isAway() ? overviewAt(_travel.moment(), names(), _screen.profile)
+                                           : _watch.overview(now, names(), _screen.profile);
     overview.ahead = _link.clock().zone(now).offset;
     return overview;
 }

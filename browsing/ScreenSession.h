@@ -3,6 +3,7 @@
 #include "app/BrowsingSession.h"
 #include "browsing/LinkNotes.h"
 #include "browsing/SafePackets.h"
+#include "browsing/SnapshotOverview.h"
 #include "browsing/ViewedTimeline.h"
 #include "host/FilePreferences.h"
 #include "host/HostFileSystem.h"
@@ -81,6 +82,7 @@ private:
     bool mayGoOn(const std::string& words);
     void begin(const std::string& technology);
     void mask(bool isSafe);
+    void take(Bytes packet, Time time);
     void tick();
     terminal::QuerySeams querySeams();
     const NetworkNames& names();
@@ -94,6 +96,8 @@ private:
     BrowseLink _link;
     SafePackets _safe;
     StatusWatch _watch;
+    SnapshotOverview _snapshot;
+    bool _isSnapshot = false; ///< the packets are the displays of a snapshot
     ViewedTimeline _timeline;
     Travel _travel;
     std::optional<std::string> _toldTrouble; ///< of the timeline, since time is held

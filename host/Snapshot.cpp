@@ -128,6 +128,13 @@ const Snapshot* snapshotOf(const Recording& recording) {
     return snapshot != nullptr ? &snapshot->snapshot() : nullptr;
 }
 
+PropertyList displayIn(Bytes message) {
+    const auto object = parsePropertyList(message);
+    const DictionaryRef keys = object ? object->dictionary() : nullptr;
+    const PropertyList* display = keys ? keys->find(kSnapshotDisplay) : nullptr;
+    return display != nullptr ? *display : PropertyList();
+}
+
 RecordingError noTimeOfSnapshot(const std::string& path) {
     return {RecordingError::Kind::NoCapture,
             formatText("%@ is a snapshot, which holds a few displays and no packets.", {path})};

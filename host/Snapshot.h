@@ -45,6 +45,9 @@ inline constexpr const char* kSnapshotDescription = "Description";
 inline constexpr const char* kSnapshotTitle = "Title";
 inline constexpr const char* kSnapshotDisplay = "Display";
 
+/// The display in one of these messages; null if there is none.
+PropertyList displayIn(Bytes message);
+
 /// The error for a snapshot where a recording is needed.
 RecordingError noTimeOfSnapshot(const std::string& path);
 

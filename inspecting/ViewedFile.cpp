@@ -4,25 +4,12 @@
 #include "host/Snapshot.h"
 #include "live/LiveSession.h"
 #include "overview/DisplayValues.h"
-#include "plist/PropertyListCodec.h"
 #include "text/Format.h"
 
 #include <algorithm>
 #include <utility>
 
 namespace pallax {
-
-namespace {
-
-/// The display in a message of a snapshot; null if there is none.
-PropertyList displayIn(Bytes message) {
-    const auto object = parsePropertyList(message);
-    const DictionaryRef keys = object ? object->dictionary() : nullptr;
-    const PropertyList* display = keys ? keys->find(kSnapshotDisplay) : nullptr;
-    return display != nullptr ? *display : PropertyList();
-}
-
-} // namespace
 
 Result<std::unique_ptr<ViewedFile>, NotSeen>
 ViewedFile::open(const std::string& path, const RecordedTechnology* technology,

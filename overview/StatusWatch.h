@@ -31,6 +31,7 @@ struct Overview {
     std::vector<LevelCurve> curves = {};
     Time curvesFrom = {};
     Time curvesTo = {};
+    bool knowsAges = true; ///< false if nothing tells when the values were read
 };
 
 /// What was known at an instant of a timeline.

@@ -115,6 +115,21 @@ TEST_F(EndToEndSnapshot, ASavedOneOpens) {
     quit(again);
 }
 
+TEST_F(EndToEndSnapshot, TheOverviewIsThatOfTheLatestDisplay) {
+    PallaxTerminal terminal(world, {lteDrive(), "--speed", "max"}, {});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    save(terminal);
+    quit(terminal);
+    PallaxTerminal again(world, {filesIn(snapshots).at(0)}, {});
+    ASSERT_TRUE(again.shows("End of the recording"));
+    again.type("o");
+    ASSERT_TRUE(again.shows("Pallax › Overview"));
+    EXPECT_TRUE(again.shows("eNodeB 104475 sector 1 · PCI 184 · TAC 6699"));
+    EXPECT_EQ(again.settled().find(" ago"), std::string::npos) << "a snapshot tells no age";
+    again.type("q"); // the page
+    quit(again);
+}
+
 TEST_F(EndToEndSnapshot, WhatIsNoneIsRefused) {
     const std::string recording = brief();
     const Run none = run({"snapshot", "--dlf", recording});

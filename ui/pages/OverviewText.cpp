@@ -228,8 +228,9 @@ Block Blocks::neighbours(std::size_t most) const {
         for (TableText& cell : levelCells(level.name, level)) {
             row.push_back(std::move(cell));
         }
-        // The age is worth more than the bar.
-        row.insert(row.end() - 1, {ageWords(_status.time - level.read), kPale, true});
+        if (_overview.knowsAges) { // an age is worth more than the bar
+            row.insert(row.end() - 1, {ageWords(_status.time - level.read), kPale, true});
+        }
     }
     constexpr std::size_t kLeast = 3;
     return {"Neighbours", table(std::move(rows)), kLeast};
