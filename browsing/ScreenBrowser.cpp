@@ -15,11 +15,20 @@ constexpr std::chrono::milliseconds kSilentWork{100};
 constexpr std::chrono::milliseconds kFrame{50}; // in which all that is typed is drawn once
 
 /// The terminal's marks, with the curves of the settings unless they must be ASCII.
-terminal::Marks marksWith(terminal::Marks marks, CurveCharacters curves) {
-    if (!marks.asciiOnly && curves == CurveCharacters::Blocks) {
+terminal::Marks marksWith(terminal::Marks marks, std::optional<CurveCharacters> curves) {
+    if (marks.asciiOnly || !curves) {
+        return marks;
+    }
+    switch (*curves) {
+    case CurveCharacters::Braille:
+        marks.curves = terminal::Curves::Braille;
+        break;
+    case CurveCharacters::Blocks:
         marks.curves = terminal::Curves::Blocks;
-    } else if (curves == CurveCharacters::Ascii) {
+        break;
+    case CurveCharacters::Ascii:
         marks.curves = terminal::Curves::Ascii;
+        break;
     }
     return marks;
 }

@@ -32,7 +32,7 @@ struct Settings {
     OnFatalRecord onFatalRecord = OnFatalRecord::Stop;    ///< on-fatal-record = stop | skip
     FirstScreen firstScreen = FirstScreen::Panes;         ///< first-screen = panes | overview
     Lists lists = Lists::Rows;                            ///< lists = rows | table
-    CurveCharacters curves = CurveCharacters::Braille;    ///< curves = braille | blocks | ascii
+    std::optional<CurveCharacters> curves;                ///< curves = braille | blocks | ascii
     std::optional<std::string> profile;                   ///< profile = NAME
     std::optional<std::string> snapshotDirectory;         ///< snapshot-directory = PATH
     std::optional<std::string> saveButtonMarker;          ///< save-button-marker = PATH

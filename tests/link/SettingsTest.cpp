@@ -74,7 +74,7 @@ TEST(Settings, WithoutAFileTheDefaultsHold) {
     EXPECT_EQ(settings->afterReconnect, AfterReconnect::Keep);
     EXPECT_EQ(settings->firstScreen, FirstScreen::Panes);
     EXPECT_EQ(settings->lists, Lists::Rows);
-    EXPECT_EQ(settings->curves, CurveCharacters::Braille);
+    EXPECT_EQ(settings->curves, std::nullopt) << "what the terminal has";
     EXPECT_EQ(settings->journal.age, std::chrono::hours(24));
     EXPECT_EQ(settings->journal.bytes, std::uint64_t{256} << 20U);
     EXPECT_TRUE(settings->alarms.empty());

@@ -38,6 +38,12 @@ struct FileCloser {
 };
 using OwnedFile = std::unique_ptr<std::FILE, FileCloser>;
 
+/// Empty if it is not known.
+std::string_view terminalType() {
+    const char* type = std::getenv("TERM");
+    return type == nullptr ? std::string_view() : type;
+}
+
 /// The sequence that restores the screen: attributes off, cursor visible, keypad and mouse off,
 /// normal screen.
 std::string restoringSequence() {
@@ -188,9 +194,8 @@ struct CursesTerminal::Impl {
 };
 
 bool CursesTerminal::isPossible() {
-    const char* type = std::getenv("TERM");
-    return ::isatty(STDOUT_FILENO) != 0 && type != nullptr && *type != '\0' &&
-           std::string_view(type) != "dumb";
+    const std::string_view type = terminalType();
+    return ::isatty(STDOUT_FILENO) != 0 && !type.empty() && type != "dumb";
 }
 
 Result<std::unique_ptr<CursesTerminal>, TerminalError>
@@ -209,8 +214,7 @@ CursesTerminal::open(const Options& options) {
     impl->restorer = std::make_unique<TerminalRestorer>(STDOUT_FILENO);
     impl->screen = ::newterm(nullptr, stdout, impl->input.get());
     if (impl->screen == nullptr) {
-        const char* type = std::getenv("TERM");
-        return TerminalError{"The terminal type \"" + std::string(type == nullptr ? "" : type) +
+        return TerminalError{"The terminal type \"" + std::string(terminalType()) +
                              "\" (TERM) is unknown; --print needs no terminal."};
     }
     impl->restorer->setSequence(restoringSequence());
@@ -249,7 +253,10 @@ int CursesTerminal::rows() const {
 }
 
 const Marks& CursesTerminal::marks() const {
-    return _impl->isUtf8 ? kUtf8Marks : kAsciiMarks;
+    if (!_impl->isUtf8) {
+        return kAsciiMarks;
+    }
+    return terminalType().starts_with("linux") ? kConsoleMarks : kUtf8Marks;
 }
 
 int CursesTerminal::inputDescriptor() const {

@@ -39,7 +39,8 @@ public:
 
     int columns() const;
     int rows() const;
-    /// ASCII unless the user's locale is UTF-8.
+    /// ASCII unless the user's locale is UTF-8; without braille on the kernel's console, whose
+    /// fonts have at most 512 characters.
     const Marks& marks() const;
     /// Readable when a key may be waiting.
     int inputDescriptor() const;

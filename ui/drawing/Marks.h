@@ -69,6 +69,14 @@ inline constexpr Marks kUtf8Marks{false,
                                   "┆",
                                   Curves::Braille};
 
+/// Without braille characters.
+inline constexpr Marks kConsoleMarks = [] {
+    Marks marks = kUtf8Marks;
+    marks.spinner = {"|", "/", "-", "\\"};
+    marks.curves = Curves::Blocks;
+    return marks;
+}();
+
 inline constexpr Marks kAsciiMarks{true, ">", ">",          "*",   "o",
                                    "~",  "^", "v",          " > ", ", ",
                                    "#",  ".", "[",          "]",   "o",
