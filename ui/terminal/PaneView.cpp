@@ -131,6 +131,9 @@ void PaneView::drawBreadcrumbs(TerminalNavigation& navigation, int right) {
         }
         drawPart(screens[index]->title(), index);
     }
+    if (columnsOf(breadcrumbs(navigation, _marks, first)) > right - kMargin) {
+        _grid.put(right - 1, kTitleRow, _marks.more, kBold);
+    }
 }
 
 /// Also says that the values are old, if they are, or which are gone since the last tick.

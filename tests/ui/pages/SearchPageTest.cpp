@@ -118,6 +118,68 @@ TEST_F(SearchPageTest, RowsAreListedAsTheTextIsTyped) {
  ──────────────────────────────────────
  find: cell id      Tab whole recording
 )");
+    EXPECT_EQ(stage.screen(200, 60), R"(
+ Pallax › Find in this frame                                                                                                                                                                     4 hits
+ ──────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────
+ Name              Value  Where
+▌Physical Cell ID  274    Serving Cell Measurements
+ Physical Cell ID  275    Measured Neighbor Cells, Physical Cell ID 275
+ Physical Cell ID  276    Measured Neighbor Cells, Physical Cell ID 276
+ Physical Cell ID  277    Measured Neighbor Cells, Physical Cell ID 277
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+
+ ──────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────────
+ find: cell id                                                                                                                                                                      Tab whole recording
+)");
     EXPECT_EQ(faultOf(draw()), "");
     stage.type("jq?");
     stage.frontEnd.resize(80, 12);

@@ -47,7 +47,7 @@ TEST_F(FrontEndFilterTest, TheCaseOfLettersDoesNotMatter) {
 TEST_F(FrontEndFilterTest, ARowWithoutAMatchIsNotShown) {
     stage.type("/no such row");
     EXPECT_EQ(stage.screen(20, 5), R"(
- … › Serving 0 of 6
+ … › Servin… 0 of 6
  ──────────────────
 
  ──────────────────

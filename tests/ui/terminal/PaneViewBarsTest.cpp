@@ -32,7 +32,7 @@ TEST_F(PaneViewBarsTest, BreadcrumbsAreShortenedFromTheLeft) {
 TEST_F(PaneViewBarsTest, ATitleWiderThanTheScreenIsCut) {
     openSection({}, "A section with a very long name");
     stage.frontEnd.resize(20, 5);
-    EXPECT_EQ(stage.line(0), " … › A section with");
+    EXPECT_EQ(stage.line(0), " … › A section wit…");
 }
 
 TEST_F(PaneViewBarsTest, HintsThatDoNotFitAreLeftOutFromTheLeft) {
@@ -147,7 +147,7 @@ TEST_F(PaneViewBarsTest, AFilterBeingTypedIsAPromptWithTheMatchesUnderlined) {
  / rsrp                                                        Esc clear filter
 )");
     EXPECT_EQ(stage.screen(20, 5), R"(
- … › Serving 2 of 6
+ … › Servin… 2 of 6
  ──────────────────
 ▌Measured RSRP   …
  ──────────── ↓ 1 ─

@@ -81,7 +81,7 @@ TEST_F(PaneViewOriginTest, TheStateOfTheStreamStandsAtTheEdgeOfTheTitle) {
     const std::pair<int, const char*> expected[] = {
         {70, " Pallax › Serving Cell Measurements       Zorell_LTE  no data for 7 s"},
         {60, " Pallax › Serving Cell Measurements         no data for 7 s"},
-        {40, " … › Serving Cell Meas  no data for 7 s"},
+        {40, " … › Serving Cell Mea…  no data for 7 s"},
         {20, " …  no data for 7 s"},
     };
     for (const auto& [columns, title] : expected) {

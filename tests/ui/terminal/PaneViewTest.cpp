@@ -154,7 +154,7 @@ TEST_F(PaneViewTest, ASectionShowsNamesLeftAndValuesRight) {
  Updated 2023-11-14 at 22:13:20  ? help
 )");
     EXPECT_EQ(stage.screen(20, 5), R"(
- … › Serving Cell M
+ … › Serving Cell …
  ──────────────────
 ▌Version         1
  ──────────── ↓ 5 ─
