@@ -2,6 +2,11 @@
 
 namespace pallax::terminal {
 
+void Pages::open(Page page) {
+    _pages.remove_if([&](const Page& each) { return each.index() == page.index(); });
+    _pages.push_back(std::move(page));
+}
+
 PageAnswer Pages::handle(const KeyEvent& event) {
     const PageAnswer answer =
         std::visit([&](auto& page) { return page.handle(event); }, _pages.back());

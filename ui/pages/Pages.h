@@ -8,9 +8,9 @@
 #include "ui/pages/SearchPage.h"
 #include "ui/pages/ValuePage.h"
 
+#include <list>
 #include <utility>
 #include <variant>
-#include <vector>
 
 namespace pallax::terminal {
 
@@ -27,7 +27,9 @@ public:
     bool shows() const {
         return isOpen() && std::holds_alternative<Kind>(_pages.back());
     }
-    void open(Page page) { _pages.push_back(std::move(page)); }
+    /// Closes another page of the same kind, so that there are never more than kinds. Not while a
+    /// page handles a key.
+    void open(Page page);
     void closeTop() { _pages.pop_back(); }
 
     /// Gives a key to the page on top, which may close by it.
@@ -35,7 +37,7 @@ public:
     void draw(const PageScreen& screen, const PageSurroundings& around);
 
 private:
-    std::vector<Page> _pages;
+    std::list<Page> _pages;
 };
 
 } // namespace pallax::terminal

@@ -208,7 +208,7 @@ void FrontEnd::handle(const KeyEvent& event) {
         needsDisplay();
     } else if (_time.isTyping() && event.key != Key::Click) {
         (void)_time.handle(event);
-    } else if (_pages.isOpen() && event.key != Key::Click) {
+    } else if (_pages.isOpen() && !modal && event.key != Key::Click) {
         handlePage(event);
     } else if (event.key == Key::Click || event.key == Key::WheelUp ||
                event.key == Key::WheelDown) {
@@ -258,9 +258,13 @@ void FrontEnd::handleAlert(const KeyEvent& event) {
     }
 }
 
-/// The keys for help and a fresh start work as in a pane.
+/// The keys that open pages, save, help and start afresh work as in a pane.
 void FrontEnd::handlePage(const KeyEvent& event) {
     if (_pages.handle(event) != PageAnswer::NotMine) {
+        if (_isPaneWanted) {
+            _pages = {};
+            _isPaneWanted = false;
+        }
         return needsDisplay();
     }
     const char32_t character = event.key == Key::Character ? event.character : 0;
@@ -272,7 +276,7 @@ void FrontEnd::handlePage(const KeyEvent& event) {
         needsDisplay();
     } else if (character == U'x') {
         _surroundings.switchSafe();
-    } else if (character == U'?' || character == U'R' || character == U'V') {
+    } else if (std::u32string_view(U"?RVoe;fs").find(character) != std::u32string_view::npos) {
         handlePaneCharacter(character);
     }
 }

@@ -182,6 +182,8 @@ private:
     Graph _graph;
     TextFinder _finder;
     std::optional<Search> _search; ///< the latest from which the user went to a hit
+    bool _isPaneWanted =
+        false; ///< the page that handles a key went to a row: no page is to be left
     Pages _pages;
     std::optional<LineEditor> _filterEditor;      ///< while a filter is being typed
     std::weak_ptr<ui::TableScreen> _filteredPane; ///< the pane of the filter

@@ -46,6 +46,7 @@ void FrontEnd::openSearch() {
                     [this](const std::string& text, const FoundRow& row) {
                         noteSearch(text, SearchScope::Frame);
                         goToPlace(row.place);
+                        _isPaneWanted = true;
                     },
                     [this](const std::string& text, std::uint64_t packet) {
                         noteSearch(text, SearchScope::Recording);

@@ -33,13 +33,46 @@ TEST_F(OverviewPageTest, OpensOverAnyPaneAndLeavesTheStackAlone) {
     EXPECT_EQ(stage.depth(), 2U);
     stage.press(Key::Down);
     stage.press(Key::Enter);
-    stage.type("sy/G");
+    stage.type("y/G");
     EXPECT_TRUE(isOpen());
-    EXPECT_EQ(stage.saveScreen(), nullptr);
     EXPECT_TRUE(stage.copied.empty());
     EXPECT_EQ(stage.depth(), 2U);
     stage.type("o");
     EXPECT_EQ(stage.screen(), pane);
+}
+
+TEST_F(OverviewPageTest, OtherPagesOpenFromItAndEachIsOpenOnce) {
+    stage.type("oeoe");
+    EXPECT_TRUE(shows("Pallax › Events"));
+    stage.type("q");
+    EXPECT_TRUE(isOpen());
+    stage.type(";");
+    EXPECT_TRUE(shows("Pallax › Query"));
+    stage.press(Key::Escape);
+    EXPECT_TRUE(isOpen());
+    stage.type("q");
+    EXPECT_EQ(stage.line(0), " Pallax");
+    EXPECT_EQ(stage.quits, 0);
+}
+
+TEST_F(OverviewPageTest, ARowThatIsFoundFromItIsShownInItsPane) {
+    stage.type("of");
+    EXPECT_TRUE(shows("Pallax › Find in this frame"));
+    stage.type("average rsrp");
+    stage.press(Key::Enter);
+    EXPECT_TRUE(shows("▌Average RSRP")) << stage.screen();
+    stage.type("of");
+    stage.press(Key::Escape);
+    EXPECT_TRUE(isOpen()) << "nothing was found";
+}
+
+TEST_F(OverviewPageTest, SavesThePresent) {
+    stage.type("os");
+    EXPECT_NE(stage.saveScreen(), nullptr);
+    stage.press(Key::Escape);
+    stage.queue.runReady();
+    EXPECT_EQ(stage.saveScreen(), nullptr);
+    EXPECT_TRUE(isOpen());
 }
 
 TEST_F(OverviewPageTest, TheKeysThatGoBackCloseIt) {
