@@ -9,11 +9,16 @@ namespace pallax {
 
 namespace {
 
-/// A suggestion of a name that ends with the word, which several columns share.
+/// A suggestion of a name that has the word in it, best at its end: "measured_rsrp" for "rsrp",
+/// "rrc_state" for "rrc".
 std::string longerName(const std::string& word, const std::vector<std::string>& names) {
-    const auto found = std::find_if(names.begin(), names.end(), [&](const std::string& name) {
-        return name.ends_with("_" + word);
-    });
+    auto found = std::find_if(names.begin(), names.end(),
+                              [&](const std::string& name) { return name.ends_with("_" + word); });
+    if (found == names.end()) {
+        found = std::find_if(names.begin(), names.end(), [&](const std::string& name) {
+            return ("_" + name + "_").find("_" + word + "_") != std::string::npos;
+        });
+    }
     return found != names.end() ? formatText(". Did you mean \"%@\"?", {*found}) : std::string();
 }
 

@@ -28,5 +28,18 @@ TEST(QueryErrorText, CountsLines) {
     EXPECT_EQ(queryErrorText({"e", 2}, "x", kNames), "e") << "no such place";
 }
 
+TEST(QueryErrorText, AWordOfANameSuggestsIt) {
+    const std::vector<std::string> names{"mm_state", "rrc_state", "rrc_state_rrc"};
+    EXPECT_EQ(queryErrorText({"no such column: state", {}}, "", names, "query"),
+              "no such column: state. Did you mean \"mm_state\"?");
+    EXPECT_EQ(queryErrorText({"no such column: mm", {}}, "", names, "query"),
+              "no such column: mm. Did you mean \"mm_state\"?");
+    EXPECT_EQ(queryErrorText({"no such column: rrc", {}}, "", names, "query"),
+              "no such column: rrc. Did you mean \"rrc_state_rrc\"?")
+        << "at the end, it names the value";
+    EXPECT_EQ(queryErrorText({"no such column: tate", {}}, "", names, "query"),
+              "no such column: tate");
+}
+
 } // namespace
 } // namespace pallax
