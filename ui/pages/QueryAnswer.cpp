@@ -27,7 +27,7 @@ std::string textOfReal(double number) {
     return text;
 }
 
-TableCell cellOf(QueryValue value) {
+TableCell cellOf(QueryValue&& value) {
     if (const auto* integer = std::get_if<std::int64_t>(&value)) {
         return {std::to_string(*integer), static_cast<double>(*integer)};
     }
