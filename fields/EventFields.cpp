@@ -75,9 +75,11 @@ constexpr std::string_view kCell = "serving cell";
 
 constexpr auto kRows = std::to_array<EventFields>({
     {"ifx", Watch::Cell, kCell, serving_cells::kIfx},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxTdScdma},
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxUmts},
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxLte},
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxNr},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxCdma},
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxLocated},
     {"ifx", Watch::State, "RR", kIfxRr},
     {"ifx", Watch::State, "modem", kIfxModem},

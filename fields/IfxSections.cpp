@@ -45,7 +45,7 @@ void addCellKeys(std::vector<ObjectKey>& objectKeys, bool isList) {
         {"EARFCN", "Channel of an LTE cell.", isList},
         {"NR-ARFCN", "Channel of an NR cell.", isList},
         {"Scrambling Code", "Primary scrambling code of a UMTS cell.", isList},
-        {"Cell Parameter ID", "Code of a TD-SCDMA cell."},
+        {"Cell Parameter ID", "Code of a TD-SCDMA cell.", isList},
         {"Physical Cell ID", "Physical cell identity of an LTE or NR cell.", isList},
         {"Base Station ID", "Identity of a CDMA base station."},
         {"SID", "CDMA system that the cell belongs to."},
