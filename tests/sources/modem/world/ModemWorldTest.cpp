@@ -228,10 +228,14 @@ TEST_F(ModemWorld, WithoutABusOrModemManagerOneSentenceTellsIt) {
         "$PALLAX" modem --list; echo "status $?"
         begin_pallax modem --print
         shows "Modem/State: ModemManager is not running"
+        end_pallax
+        begin_pallax record --modem "$folder/drive.pcapng"
+        until [ -s "$folder/err" ]; do sleep 0.1; done
         end_pallax)steps");
     EXPECT_EQ(noManager.out, "pallax: ModemManager is not running.\n"
                              "status 1\n"
-                             "Modem/State: ModemManager is not running\n");
+                             "Modem/State: ModemManager is not running\n"
+                             "pallax: ModemManager is not running; Pallax waits for it.\n");
 }
 
 TEST_F(ModemWorld, AMockOfACdmaModemAndOfOneThatTellsNrCells) {
