@@ -174,6 +174,20 @@ TEST_F(MaskCommandTest, WithCoarsePlacesTheSameCellHasTheSameTokenInAllFiles) {
     EXPECT_NE(doubles::contentOf(output), first);
 }
 
+TEST_F(MaskCommandTest, CoarsePlacesOfARealModemAreInAllItsSections) {
+    const MaskOptions options{.files = {sample("modem-mbim.pcapng")},
+                              .output = output,
+                              .choice = {.coarsePlace = true},
+                              .keyFile = key("sixteen bytes ok")};
+    ASSERT_EQ(mask(options), kExitSuccess);
+    const std::string before = doubles::contentOf(sample("modem-mbim.pcapng"));
+    const std::string after = doubles::contentOf(output);
+    for (const char* place : {"33997", "1382843", "11183", "4886718346"}) { // areas and cells
+        EXPECT_NE(before.find(place), std::string::npos) << place;
+        EXPECT_EQ(after.find(place), std::string::npos) << place;
+    }
+}
+
 TEST_F(MaskCommandTest, AFileOfAnotherKindHasNoCopy) {
     const std::string file = folder.write("text", "<html>");
     EXPECT_EQ(mask({.files = {file}, .output = output}), kExitFailure);
