@@ -49,6 +49,21 @@ TEST(IdentityFinder, FindsPhoneNumbersInInternationalForm) {
     EXPECT_EQ(found("4915112345678"), "");
 }
 
+TEST(IdentityFinder, FindsDigitsInGroups) {
+    EXPECT_EQ(found("tel:+49 151 1234-5678,"), "4+17 phone number in text");
+    EXPECT_EQ(found("49-015420-323751-8"), "0+18 IMEI in text");
+    EXPECT_EQ(found("490154-20-323751-8 "), "0+18 IMEI in text");
+    EXPECT_EQ(found("49-015420-323751-7"), "") << "its check digit is wrong";
+    EXPECT_EQ(found("4901-5420-3237-518"), "") << "nobody writes it so";
+    EXPECT_EQ(found("+49 151  12345678"), "") << "two blanks";
+    EXPECT_EQ(found("151 1234 5678"), "");
+    ByteBuffer wide;
+    for (const char letter : std::string("+49 151 12345678")) {
+        wide.insert(wide.end(), {static_cast<std::uint8_t>(letter), 0});
+    }
+    EXPECT_EQ(found(wide), "0+31 phone number in UTF-16");
+}
+
 TEST(IdentityFinder, FindsUtf16OfEitherByteOrder) {
     const std::string imsi = "262011234567890";
     ByteBuffer big{0xFF};

@@ -188,6 +188,26 @@ TEST_F(MaskCommandTest, CoarsePlacesOfARealModemAreInAllItsSections) {
     }
 }
 
+TEST_F(MaskCommandTest, AddressesOfAnInterfaceAreZeros) {
+    using namespace std::string_literals;
+    const std::string file = folder.path("a.pcapng");
+    {
+        const auto writer = PcapNgWriter::create(file, PcapNgWriter::Existing::Overwrite);
+        ASSERT_FALSE((*writer)->begin(150, "Zorell_LTE"));
+        ASSERT_FALSE((*writer)->write(kSampleStart, {}));
+    }
+    // An interface block: its name (2), MAC address (6), the end of its options.
+    const std::string interface = "\1\0\0\0\x2C\0\0\0\x96\0\0\0\0\0\0\0"
+                                  "\2\0\4\0wwan\6\0\6\0\2\x42\x99\x17\x2A\x5E\0\0\0\0\0\0"
+                                  "\x2C\0\0\0"s;
+    const std::string before = doubles::contentOf(file) + interface;
+    (void)folder.write("a.pcapng", before);
+    ASSERT_EQ(mask({.files = {file}, .output = output}), kExitSuccess);
+    const std::string after = doubles::contentOf(output);
+    EXPECT_NE(after.find("wwan\6\0\6\0\0\0\0\0\0\0"s), std::string::npos);
+    EXPECT_EQ(differences(before, after), 6U);
+}
+
 TEST_F(MaskCommandTest, AFileOfAnotherKindHasNoCopy) {
     const std::string file = folder.write("text", "<html>");
     EXPECT_EQ(mask({.files = {file}, .output = output}), kExitFailure);
