@@ -43,7 +43,7 @@ std::optional<StatusOperator> statusNetworkOf(const CurrentValues& values,
                                       : NetworkCode::in(textOf(rule->code));
     if (!network.code) {
         network.code = home;
-        network.isHome = rule->mcc.empty() && rule->code.empty() && home;
+        network.isHome = home.has_value();
     }
     const std::string given = textOf(rule->name);
     const std::string stored = network.code == home ? textOf(rule->simName) : std::string();

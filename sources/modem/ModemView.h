@@ -23,6 +23,7 @@ struct ModemView {
 
     Presence presence = Presence::Waiting; ///< Waiting: for any modem
     std::string model;                     ///< the latest known, also while the modem is away
+    std::string equipment;                 ///< its number, likewise
     /// By the interface's full name.
     Dictionary interfaces;
     Dictionary sim;

@@ -281,6 +281,21 @@ TEST(Status, ANameOfTheNetworkComesFirst) {
     EXPECT_FALSE(network->isHome);
 }
 
+TEST(Status, AModemThatIsNotRegisteredHasTheNetworkOfItsSim) {
+    const auto operatorOf = [](const Dictionary& registration) {
+        ValuesFixture ifx("ifx");
+        ifx.read(0, {{"Registration", registration},
+                     {"SIM", Dictionary{{"Operator", "Home"}, {"Operator Code", "26242"}}}});
+        return *statusAt(0, ifx).network;
+    };
+    const auto searching = operatorOf({{"State", "searching"}, {"Technology", "unknown"}});
+    EXPECT_EQ(searching.name, "Home");
+    EXPECT_TRUE(searching.isHome);
+    const auto roaming = operatorOf({{"State", "roaming"}, {"Operator Code", "26201"}});
+    EXPECT_EQ(roaming.name, "Netz");
+    EXPECT_FALSE(roaming.isHome);
+}
+
 TEST(Status, TheNameInTheSimIsThatOfItsOwnNetworkOnly) {
     const auto operatorOf = [](const char* mnc) {
         ValuesFixture gsm("gsm");
