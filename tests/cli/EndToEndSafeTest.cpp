@@ -193,6 +193,7 @@ TEST_F(EndToEndSafe, TheKeyHidesTheIdentitiesOfAllModems) {
             terminal.type(std::string(modem) + "/sim info\r");
             ASSERT_TRUE(terminal.shows("1 of 26"));
             terminal.type("\r");
+            ASSERT_TRUE(terminal.showsNoMore("1 of 26"));
         }
     };
     openBoth();
