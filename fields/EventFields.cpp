@@ -44,9 +44,15 @@ constexpr std::array<Names, 7> kIfxRegistered{"home",
                                               "roaming, SMS only",
                                               "home, CSFB not preferred",
                                               "roaming, CSFB not preferred"};
-constexpr std::array<Names, 8> kIfxUnregistered{
-    "idle",     "searching", "denied",        "unknown",
-    "no modem", "unplugged", "no system bus", "ModemManager is not running"};
+constexpr std::array<Names, 9> kIfxUnregistered{"idle",
+                                                "searching",
+                                                "denied",
+                                                "unknown",
+                                                "no modem",
+                                                "unplugged",
+                                                "no system bus",
+                                                "ModemManager is not running",
+                                                "ModemManager does not answer"};
 constexpr std::array<Names, 1> kServiceType{"gsm.serving_plmn.service_type"};
 constexpr std::array<Names, 3> kService{"CS_ONLY", "PS_ONLY", "CS_PS_SERVICE"};
 constexpr std::array<Names, 2> kNoService{"NO_SERVICE", "LIMITED_SERVICE"};

@@ -134,10 +134,11 @@ std::optional<HostError> ModemStream::begin(const LocalModem& modem, const Repor
     } else if (objects.error().isDenied()) {
         return HostError{"This user may not ask ModemManager: the system bus rejects it."};
     } else {
-        _watch.managerLeft(ModemView::Presence::NoManager);
-        report(objects.error().isUnanswered()
-                   ? "ModemManager does not answer; Pallax asks again."
-                   : "ModemManager is not running; Pallax waits for it.");
+        const bool isSilent = objects.error().isUnanswered();
+        _watch.managerLeft(isSilent ? ModemView::Presence::NoAnswer
+                                    : ModemView::Presence::NoManager);
+        report(isSilent ? "ModemManager does not answer; Pallax asks again."
+                        : "ModemManager is not running; Pallax waits for it.");
     }
     _bus->follow(_watch, [this] { lost(); });
     if (!objects) {

@@ -29,6 +29,8 @@ std::string_view absenceOf(const ModemView& view) {
         return "no system bus";
     case ModemView::Presence::NoManager:
         return "ModemManager is not running";
+    case ModemView::Presence::NoAnswer:
+        return "ModemManager does not answer";
     case ModemView::Presence::Unplugged:
         return "unplugged";
     default:

@@ -19,7 +19,7 @@ enum class Access {
 /// All that is known of one modem. The dictionaries hold properties as the bus told them (see
 /// BusValues.h).
 struct ModemView {
-    enum class Presence { NoBus, NoManager, Waiting, Unplugged, There };
+    enum class Presence { NoBus, NoManager, NoAnswer, Waiting, Unplugged, There };
 
     Presence presence = Presence::Waiting; ///< Waiting: for any modem
     std::string model;                     ///< the latest known, also while the modem is away

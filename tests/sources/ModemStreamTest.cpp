@@ -142,6 +142,8 @@ TEST_F(ModemStreamTest, AModemManagerThatDoesNotAnswerIsAskedAgain) {
     ASSERT_EQ(open(), "");
     EXPECT_EQ(told, Lines{"ModemManager does not answer; Pallax asks again."});
     EXPECT_EQ(askedForObjects, 1);
+    pass(1s);
+    EXPECT_EQ(nextState(), "ModemManager does not answer");
 }
 
 TEST_F(ModemStreamTest, WhatWaitingDoesNotHealIsAFailure) {

@@ -170,6 +170,7 @@ TEST(ModemPictureTest, AMissingModemIsToldInEverySection) {
     for (const auto& [presence, words] :
          {std::pair(ModemView::Presence::NoBus, "no system bus"),
           std::pair(ModemView::Presence::NoManager, "ModemManager is not running"),
+          std::pair(ModemView::Presence::NoAnswer, "ModemManager does not answer"),
           std::pair(ModemView::Presence::Waiting, "no modem"),
           std::pair(ModemView::Presence::Unplugged, "unplugged")}) {
         ModemView view;

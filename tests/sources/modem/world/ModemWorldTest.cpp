@@ -238,6 +238,18 @@ TEST_F(ModemWorld, WithoutABusOrModemManagerOneSentenceTellsIt) {
                              "pallax: ModemManager is not running; Pallax waits for it.\n");
 }
 
+TEST_F(ModemWorld, AModemManagerThatHangsIsAskedAgain) {
+    const auto run = in("at-world", R"steps(
+        manager=$(modem_manager_pid)
+        kill -STOP $manager
+        begin_pallax record --modem "$folder/drive.pcapng"
+        until [ -s "$folder/err" ]; do sleep 0.1; done
+        kill -CONT $manager
+        until "$PALLAX" decode "$folder/drive.pcapng" | grep -q SampleNet; do sleep 0.1; done
+        end_pallax)steps");
+    EXPECT_EQ(run.out, "pallax: ModemManager does not answer; Pallax asks again.\n");
+}
+
 TEST_F(ModemWorld, AMockOfACdmaModemAndOfOneThatTellsNrCells) {
     const auto run = in("mock-modems.py --picture both --release 1.22", R"steps(
         begin_pallax modem 0 --print
