@@ -230,7 +230,7 @@ TEST_F(ModemWorld, WithoutABusOrModemManagerOneSentenceTellsIt) {
         shows "Modem/State: ModemManager is not running"
         end_pallax
         begin_pallax record --modem "$folder/drive.pcapng"
-        until [ -s "$folder/err" ]; do sleep 0.1; done
+        succeeds "[ -s $folder/err ]"
         end_pallax)steps");
     EXPECT_EQ(noManager.out, "pallax: ModemManager is not running.\n"
                              "status 1\n"
@@ -243,9 +243,9 @@ TEST_F(ModemWorld, AModemManagerThatHangsIsAskedAgain) {
         manager=$(modem_manager_pid)
         kill -STOP $manager
         begin_pallax record --modem "$folder/drive.pcapng"
-        until [ -s "$folder/err" ]; do sleep 0.1; done
+        succeeds "[ -s $folder/err ]"
         kill -CONT $manager
-        until "$PALLAX" decode "$folder/drive.pcapng" | grep -q SampleNet; do sleep 0.1; done
+        succeeds "grep -q SampleNet $folder/drive.pcapng"
         end_pallax)steps");
     EXPECT_EQ(run.out, "pallax: ModemManager does not answer; Pallax asks again.\n");
 }
