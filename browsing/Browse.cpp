@@ -155,7 +155,11 @@ bool isSnapshot(const Source& source) {
 Result<std::unique_ptr<ChildService>, HostError> startChild(const BrowseOptions& options) {
     const auto* stream = std::get_if<StreamedRecording>(&options.source);
     if (stream == nullptr || stream->path == "-") {
-        return ChildService::start({options.source, options.play});
+        auto started = ChildService::start({options.source, options.play});
+        if (started && isLive(options.source)) {
+            (void)(*started)->takeComplaints(); // the picture says what is waited for
+        }
+        return started;
     }
     auto opened = RecordingFile::open(stream->path, complain);
     if (!opened) {

@@ -11,7 +11,7 @@ namespace {
 
 constexpr const char* kModemFooter = R"(Examples:
   pallax modem                         the first modem that is enabled
-  pallax modem MB-5                  another one, by its model
+  pallax modem MB-5                    another one, by its model
   pallax modem --list
   pallax record --modem drive.pcapng
 

@@ -64,8 +64,10 @@ with such a file says what is expected of a decoder.
 
 Without such a file, verify asks the digests that pallax record writes into its
 pcapng files, one for each 1024 packets and one at the end, and tells whether
-the recording is whole and unchanged. If the recorder was killed, the packets
-after the last digest have none, and verify says how many: status 3.
+the recording is whole and unchanged. If the recorder was killed, or the end
+of the file is lost, the packets after the last digest have none, and verify
+says how many: status 3. A recorder that is killed before 1024 packets leaves
+no digest at all.
 
 The digests (SHA-256) show damage and drift. They do not show forgery: who
 changes a recording can write them anew. Those beside a recording do not show

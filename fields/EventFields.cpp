@@ -44,9 +44,15 @@ constexpr std::array<Names, 7> kIfxRegistered{"home",
                                               "roaming, SMS only",
                                               "home, CSFB not preferred",
                                               "roaming, CSFB not preferred"};
-constexpr std::array<Names, 8> kIfxUnregistered{
-    "idle",     "searching", "denied",        "unknown",
-    "no modem", "unplugged", "no system bus", "ModemManager is not running"};
+constexpr std::array<Names, 9> kIfxUnregistered{"idle",
+                                                "searching",
+                                                "denied",
+                                                "unknown",
+                                                "no modem",
+                                                "unplugged",
+                                                "no system bus",
+                                                "ModemManager is not running",
+                                                "ModemManager does not answer"};
 constexpr std::array<Names, 1> kServiceType{"gsm.serving_plmn.service_type"};
 constexpr std::array<Names, 3> kService{"CS_ONLY", "PS_ONLY", "CS_PS_SERVICE"};
 constexpr std::array<Names, 2> kNoService{"NO_SERVICE", "LIMITED_SERVICE"};
@@ -75,9 +81,11 @@ constexpr std::string_view kCell = "serving cell";
 
 constexpr auto kRows = std::to_array<EventFields>({
     {"ifx", Watch::Cell, kCell, serving_cells::kIfx},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxTdScdma},
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxUmts},
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxLte},
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxNr},
+    {"ifx", Watch::Cell, kCell, serving_cells::kIfxCdma},
     {"ifx", Watch::Cell, kCell, serving_cells::kIfxLocated},
     {"ifx", Watch::State, "RR", kIfxRr},
     {"ifx", Watch::State, "modem", kIfxModem},

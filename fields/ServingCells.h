@@ -11,10 +11,13 @@ inline constexpr std::array<std::string_view, 2> kIfx{"ifx.serving_cell.arfcn",
                                                       "ifx.serving_cell.bsic"};
 inline constexpr std::array<std::string_view, 2> kIfxUmts{"ifx.serving_cell.uarfcn",
                                                           "ifx.serving_cell.scrambling_code"};
+inline constexpr std::array<std::string_view, 2> kIfxTdScdma{"ifx.serving_cell.cell_parameter_id",
+                                                             "ifx.serving_cell.uarfcn"};
 inline constexpr std::array<std::string_view, 2> kIfxLte{"ifx.serving_cell.earfcn",
                                                          "ifx.serving_cell.physical_cell_id"};
 inline constexpr std::array<std::string_view, 2> kIfxNr{"ifx.serving_cell.nr_arfcn",
                                                         "ifx.serving_cell.physical_cell_id"};
+inline constexpr std::array<std::string_view, 1> kIfxCdma{"ifx.serving_cell.pn"};
 /// Where only the location tells of the cell.
 inline constexpr std::array<std::string_view, 1> kIfxLocated{"ifx.serving_cell.cell_id"};
 inline constexpr std::array<std::string_view, 2> kGsm{"gsm.gsm_serving_cell.arfcn",

@@ -126,6 +126,13 @@ constexpr auto kIfxUmts = std::to_array<StatusField>({
     {Kind::Level, "RSCP", "ifx.serving_cell.rscp"},
     {Kind::Level, "Ec/Io", "ifx.serving_cell.ec_io"},
 });
+constexpr auto kIfxTdScdma = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.serving_cell.cell_id"},
+    {Kind::Identity, "CPID", "ifx.serving_cell.cell_parameter_id"},
+    {Kind::Identity, "LAC", "ifx.serving_cell.lac"},
+    {Kind::Channel, "UARFCN", "ifx.serving_cell.uarfcn"},
+    {Kind::Level, "RSCP", "ifx.serving_cell.rscp"},
+});
 constexpr auto kIfxLte = std::to_array<StatusField>({
     {Kind::Site, "cell", "ifx.serving_cell.cell_id"},
     {Kind::Identity, "PCI", "ifx.serving_cell.physical_cell_id"},
@@ -144,9 +151,76 @@ constexpr auto kIfxNr = std::to_array<StatusField>({
     {Kind::Level, "RSRQ", "ifx.serving_cell.rsrq"},
     {Kind::Level, "SINR", "ifx.serving_cell.sinr"},
 });
+constexpr auto kIfxCdma = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.serving_cell.base_station_id"},
+    {Kind::Identity, "PN", "ifx.serving_cell.pn"},
+    {Kind::Identity, "NID", "ifx.serving_cell.nid"},
+    {Kind::Identity, "SID", "ifx.serving_cell.sid"},
+    {Kind::Level, "RSSI", "ifx.serving_cell.rssi"},
+    {Kind::Level, "Ec/Io", "ifx.serving_cell.ec_io"},
+});
+
+// Cells that serve beside the serving cell.
+constexpr auto kIfxFurtherGsm = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.further_serving_cells.cell_id"},
+    {Kind::Identity, "BSIC", "ifx.further_serving_cells.bsic"},
+    {Kind::Identity, "LAC", "ifx.further_serving_cells.lac"},
+    {Kind::Channel, "ARFCN", "ifx.further_serving_cells.arfcn"},
+    {Kind::Level, "RxLev", "ifx.further_serving_cells.rx_level"},
+});
+constexpr auto kIfxFurtherUmts = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.further_serving_cells.cell_id"},
+    {Kind::Identity, "PSC", "ifx.further_serving_cells.scrambling_code"},
+    {Kind::Identity, "LAC", "ifx.further_serving_cells.lac"},
+    {Kind::Channel, "UARFCN", "ifx.further_serving_cells.uarfcn"},
+    {Kind::Level, "RSCP", "ifx.further_serving_cells.rscp"},
+    {Kind::Level, "Ec/Io", "ifx.further_serving_cells.ec_io"},
+});
+constexpr auto kIfxFurtherTdScdma = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.further_serving_cells.cell_id"},
+    {Kind::Identity, "CPID", "ifx.further_serving_cells.cell_parameter_id"},
+    {Kind::Identity, "LAC", "ifx.further_serving_cells.lac"},
+    {Kind::Channel, "UARFCN", "ifx.further_serving_cells.uarfcn"},
+    {Kind::Level, "RSCP", "ifx.further_serving_cells.rscp"},
+});
+constexpr auto kIfxFurtherLte = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.further_serving_cells.cell_id"},
+    {Kind::Identity, "PCI", "ifx.further_serving_cells.physical_cell_id"},
+    {Kind::Identity, "TAC", "ifx.further_serving_cells.tac"},
+    {Kind::Channel, "EARFCN", "ifx.further_serving_cells.earfcn"},
+    {Kind::Level, "RSRP", "ifx.further_serving_cells.rsrp"},
+    {Kind::Level, "RSRQ", "ifx.further_serving_cells.rsrq"},
+    {Kind::Level, "SINR", "ifx.further_serving_cells.sinr"},
+});
+constexpr auto kIfxFurtherNr = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.further_serving_cells.cell_id"},
+    {Kind::Identity, "PCI", "ifx.further_serving_cells.physical_cell_id"},
+    {Kind::Identity, "TAC", "ifx.further_serving_cells.tac"},
+    {Kind::Channel, "NR-ARFCN", "ifx.further_serving_cells.nr_arfcn"},
+    {Kind::Level, "RSRP", "ifx.further_serving_cells.rsrp"},
+    {Kind::Level, "RSRQ", "ifx.further_serving_cells.rsrq"},
+    {Kind::Level, "SINR", "ifx.further_serving_cells.sinr"},
+});
+constexpr auto kIfxFurtherCdma = std::to_array<StatusField>({
+    {Kind::Site, "cell", "ifx.further_serving_cells.base_station_id"},
+    {Kind::Identity, "PN", "ifx.further_serving_cells.pn"},
+    {Kind::Identity, "NID", "ifx.further_serving_cells.nid"},
+    {Kind::Identity, "SID", "ifx.further_serving_cells.sid"},
+    {Kind::Level, "RSSI", "ifx.further_serving_cells.rssi"},
+    {Kind::Level, "Ec/Io", "ifx.further_serving_cells.ec_io"},
+});
+
+constexpr auto kIfxNeighbours = std::to_array<StatusField>({
+    {Kind::Identity, "ARFCN", "ifx.neighbour_cells.arfcn"},
+    {Kind::Identity, "BSIC", "ifx.neighbour_cells.bsic"},
+});
 constexpr auto kIfxUmtsNeighbours = std::to_array<StatusField>({
     {Kind::Identity, "UARFCN", "ifx.neighbour_cells.uarfcn"},
     {Kind::Identity, "PSC", "ifx.neighbour_cells.scrambling_code"},
+});
+constexpr auto kIfxTdScdmaNeighbours = std::to_array<StatusField>({
+    {Kind::Identity, "UARFCN", "ifx.neighbour_cells.uarfcn"},
+    {Kind::Identity, "CPID", "ifx.neighbour_cells.cell_parameter_id"},
 });
 constexpr auto kIfxLteNeighbours = std::to_array<StatusField>({
     {Kind::Identity, "EARFCN", "ifx.neighbour_cells.earfcn"},
@@ -156,10 +230,24 @@ constexpr auto kIfxNrNeighbours = std::to_array<StatusField>({
     {Kind::Identity, "NR-ARFCN", "ifx.neighbour_cells.nr_arfcn"},
     {Kind::Identity, "PCI", "ifx.neighbour_cells.physical_cell_id"},
 });
+constexpr auto kIfxCdmaNeighbours = std::to_array<StatusField>({
+    {Kind::Identity, "PN", "ifx.neighbour_cells.pn"},
+});
 constexpr std::string_view kIfxSystem = "ifx.serving_cell.technology";
+constexpr std::string_view kIfxFurtherSystem = "ifx.further_serving_cells.technology";
 constexpr std::string_view kIfxNeighbourSystem = "ifx.neighbour_cells.technology";
+constexpr auto kIfxLists = std::to_array<StatusList>({
+    {"RxLev", "ifx.neighbour_cells.rx_level", kIfxNeighbours},
+});
 constexpr auto kIfxUmtsLists = std::to_array<StatusList>({
     {"RSCP", "ifx.neighbour_cells.rscp", kIfxUmtsNeighbours, {}, {kIfxNeighbourSystem, "UMTS"}},
+});
+constexpr auto kIfxTdScdmaLists = std::to_array<StatusList>({
+    {"RSCP",
+     "ifx.neighbour_cells.rscp",
+     kIfxTdScdmaNeighbours,
+     {},
+     {kIfxNeighbourSystem, "TD-SCDMA"}},
 });
 constexpr auto kIfxLteLists = std::to_array<StatusList>({
     {"RSRP", "ifx.neighbour_cells.rsrp", kIfxLteNeighbours, {}, {kIfxNeighbourSystem, "LTE"}},
@@ -167,20 +255,35 @@ constexpr auto kIfxLteLists = std::to_array<StatusList>({
 constexpr auto kIfxNrLists = std::to_array<StatusList>({
     {"RSRP", "ifx.neighbour_cells.rsrp", kIfxNrNeighbours, {}, {kIfxNeighbourSystem, "NR"}},
 });
-constexpr auto kIfxNeighbours = std::to_array<StatusField>({
-    {Kind::Identity, "ARFCN", "ifx.neighbour_cells.arfcn"},
-    {Kind::Identity, "BSIC", "ifx.neighbour_cells.bsic"},
-});
-constexpr auto kIfxLists = std::to_array<StatusList>({
-    {"RxLev", "ifx.neighbour_cells.rx_level", kIfxNeighbours},
+constexpr auto kIfxCdmaLists = std::to_array<StatusList>({
+    {"Ec/Io", "ifx.neighbour_cells.ec_io", kIfxCdmaNeighbours, {}, {kIfxNeighbourSystem, "CDMA"}},
 });
 
 constexpr auto kStatusCells = std::to_array<StatusCellFields>({
     {"ifx", "GSM", RadioSystem::Gsm, kIfx, kIfxLists, {kIfxSystem, ""}},
     {"ifx", "GSM", RadioSystem::Gsm, kIfx, {}, {kIfxSystem, "GSM"}},
     {"ifx", "UMTS", RadioSystem::UmtsFdd, kIfxUmts, kIfxUmtsLists, {kIfxSystem, "UMTS"}},
+    {"ifx",
+     "TD-SCDMA",
+     RadioSystem::UtraTdd,
+     kIfxTdScdma,
+     kIfxTdScdmaLists,
+     {kIfxSystem, "TD-SCDMA"}},
     {"ifx", "LTE", RadioSystem::Lte, kIfxLte, kIfxLteLists, {kIfxSystem, "LTE"}},
     {"ifx", "NR", RadioSystem::Nr, kIfxNr, kIfxNrLists, {kIfxSystem, "NR"}},
+    {"ifx", "CDMA", RadioSystem::Cdma, kIfxCdma, kIfxCdmaLists, {kIfxSystem, "CDMA"}},
+    {"ifx", "GSM", RadioSystem::Gsm, kIfxFurtherGsm, {}, {kIfxFurtherSystem, "GSM"}, true},
+    {"ifx", "UMTS", RadioSystem::UmtsFdd, kIfxFurtherUmts, {}, {kIfxFurtherSystem, "UMTS"}, true},
+    {"ifx",
+     "TD-SCDMA",
+     RadioSystem::UtraTdd,
+     kIfxFurtherTdScdma,
+     {},
+     {kIfxFurtherSystem, "TD-SCDMA"},
+     true},
+    {"ifx", "LTE", RadioSystem::Lte, kIfxFurtherLte, {}, {kIfxFurtherSystem, "LTE"}, true},
+    {"ifx", "NR", RadioSystem::Nr, kIfxFurtherNr, {}, {kIfxFurtherSystem, "NR"}, true},
+    {"ifx", "CDMA", RadioSystem::Cdma, kIfxFurtherCdma, {}, {kIfxFurtherSystem, "CDMA"}, true},
     {"gsm", "GSM", RadioSystem::Gsm, kGsm, kGsmLists},
     {"gsm", "UMTS", RadioSystem::UmtsFdd, kUmts, kUmtsLists},
     {"cdma", "1x", RadioSystem::Cdma, kOneX, kOneXLists},

@@ -52,6 +52,8 @@ struct StatusCellFields {
     std::span<const StatusField> fields;
     std::span<const StatusList> lists;
     StatusCondition only = {}; ///< of the fields
+    /// The fields and the condition are of a list, and each of its entries is a cell.
+    bool isList = false;
 };
 std::span<const StatusCellFields> statusCells();
 

@@ -291,6 +291,8 @@ bool CapturePieces::describePacket(CapturePiece& piece, std::size_t head,
 
 void CapturePieces::addComments(CapturePiece& piece, std::size_t options) const {
     constexpr std::uint32_t kComment = 1;
+    constexpr std::uint32_t kFirstAddress = 4; // of an interface: IPv4, IPv6, MAC and EUI
+    constexpr std::uint32_t kLastAddress = 7;
     constexpr std::uint32_t kFirstPrivate = 2988; // custom options, and those of no standard
     constexpr std::size_t kShort = 2;
     const std::size_t end = piece.bytes.size() - kNumber;
@@ -301,7 +303,9 @@ void CapturePieces::addComments(CapturePiece& piece, std::size_t options) const 
         if (code == 0 || length > end - value) {
             break;
         }
-        if (code == kComment || code >= kFirstPrivate) {
+        const bool isAddress =
+            piece.blockType == kInterface && code >= kFirstAddress && code <= kLastAddress;
+        if (code == kComment || code >= kFirstPrivate || isAddress) {
             piece.remarks.push_back({value, length});
         }
         options = value + padded(length);

@@ -19,7 +19,8 @@ struct CapturePiece {
         Packet,
         Other, ///< a block of pcapng that holds no packet
     };
-    /// Where something that is no packet may hold any text: a comment, an unknown block.
+    /// Where something that is no packet may hold any text or an address: a comment, an unknown
+    /// block, the addresses of an interface.
     struct Remark {
         std::size_t offset;
         std::size_t length;

@@ -21,8 +21,7 @@ struct CapturePiece;
 ///   12  packets of the section so far (64 bits, little-endian)
 ///   20  1 at the end of the recording, otherwise 0 (32 bits, little-endian)
 ///   24  SHA-256 of the bytes since the previous such block, or since the beginning of the file,
-///   and
-///       of this body up to here
+///       and of this body up to here
 class EmbeddedDigests {
 public:
     static constexpr std::uint64_t kPacketsOfBlock = 1024;
@@ -32,9 +31,10 @@ public:
     struct Block {
         std::uint64_t packets;
         bool isLast;
-        bool isRight; ///< its digest is that of the bytes before it
+        bool isRight; ///< it is undamaged, and its digest is that of the bytes before it
     };
 
+    /// Whether it is such a block, or one in which a few bytes have changed.
     static bool isBlock(const CapturePiece& piece);
 
     /// Adds bytes of the file that are no digest.

@@ -15,7 +15,9 @@ namespace {
 constexpr std::size_t kColumns = 80;
 constexpr std::string_view kBetween = " · ";
 constexpr std::size_t kLabelWidth = 12;
-constexpr std::size_t kLines = 10; // more than there are kinds of rows
+constexpr std::size_t kLines = 10;
+/// With one row of each other kind, they fit in the lines.
+constexpr std::size_t kCells = 4;
 constexpr std::size_t kNeighbours = 3;
 
 std::size_t widthOf(const std::string& text) {
@@ -102,8 +104,13 @@ std::vector<Row> StatusRows::rows(const StatusOrigin& origin) const {
     if (_status.network) {
         rows.push_back(operatorRow(*_status.network));
     }
-    for (const StatusCell& cell : _status.cells) {
-        rows.push_back(cellRow(cell));
+    const std::size_t cells = _status.cells.size();
+    const std::size_t shown = cells <= kCells ? cells : kCells - 1;
+    for (std::size_t index = 0; index < shown; ++index) {
+        rows.push_back(cellRow(_status.cells[index]));
+    }
+    if (shown < cells) {
+        rows.push_back({"cells", {formatText("%zu more", {cells - shown})}});
     }
     for (Row& row : std::vector<Row>{levelRow(), stateRow(), neighbourRow(), contextRow()}) {
         rows.push_back(std::move(row));

@@ -41,15 +41,20 @@ std::optional<RecordingError> FileCheck::run(RecordingContent content, const std
         return checkBytes(std::move(content), name);
     }
     CapturePieces pieces(std::move(content), name);
+    EmbeddedDigests digests;
     std::uint64_t offset = 0;
     while (const auto piece = pieces.next()) {
+        const auto digest = digests.take(*piece);
+        if (!digest) {
+            digests.add(piece->bytes, piece->kind == CapturePiece::Kind::Packet);
+        }
         if (piece->kind == CapturePiece::Kind::Packet) {
             checkPacket(*piece);
             for (const CapturePiece::Remark& remark : piece->remarks) {
                 checkContent(Bytes(piece->bytes).subspan(remark.offset, remark.length), 0,
                              offset + remark.offset);
             }
-        } else if (!EmbeddedDigests::isBlock(*piece)) {
+        } else if (!digest || !digest->isRight) { // anything may be in a wrong one
             checkContent(piece->bytes, 0, offset);
         }
         offset += piece->bytes.size();

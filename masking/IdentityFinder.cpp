@@ -3,10 +3,12 @@
 #include "knowledge/CountryCodes.h"
 
 #include <algorithm>
+#include <array>
 #include <functional>
 #include <optional>
 #include <set>
 #include <string>
+#include <vector>
 
 namespace pallax {
 
@@ -77,6 +79,46 @@ std::optional<Kind> kindOf(std::string_view digits, bool hasPlus) {
     return isIccid(digits) ? std::optional(Kind::Iccid) : std::nullopt;
 }
 
+/// Digits in groups, with one blank or dash between them.
+struct Groups {
+    std::string digits;
+    std::vector<std::size_t> sizes{0};
+    std::size_t end = 0; ///< behind the last digit
+};
+
+Groups groupsAt(Bytes bytes, std::size_t begin, std::size_t stride) {
+    Groups groups;
+    for (std::size_t at = begin; at < bytes.size(); at += stride) {
+        const bool isLetter = stride == 1 || at == begin || bytes[at - 1] == 0;
+        if (isLetter && isDigit(bytes[at]) && groups.digits.size() <= kMostPhoneDigits) {
+            groups.digits += static_cast<char>(bytes[at]);
+            ++groups.sizes.back();
+            groups.end = at + 1;
+        } else if (isLetter && (bytes[at] == ' ' || bytes[at] == '-') && groups.sizes.back() > 0) {
+            groups.sizes.push_back(0);
+        } else {
+            break;
+        }
+    }
+    if (groups.sizes.back() == 0) {
+        groups.sizes.pop_back();
+    }
+    return groups;
+}
+
+/// Written as people write it: a phone number in groups of any size, an IMEI in its own.
+std::optional<Kind> kindOf(const Groups& groups, bool hasPlus) {
+    using Sizes = std::vector<std::size_t>;
+    static const std::array<Sizes, 3> imei{Sizes{2, 6, 6, 1}, Sizes{6, 2, 6, 1}, Sizes{8, 6, 1}};
+    const bool isImei = std::find(imei.begin(), imei.end(), groups.sizes) != imei.end();
+    if (hasPlus) {
+        return kindOf(groups.digits, true);
+    }
+    return isImei && isVaried(groups.digits) && hasCheckDigit(groups.digits)
+               ? std::optional(Kind::Imei)
+               : std::nullopt;
+}
+
 /// Looks for digits in letters of one or two bytes.
 void findLetters(Bytes bytes, std::size_t stride, std::vector<FoundIdentity>& found) {
     // Of letters of two bytes, the other byte of the last one may be followed by anything.
@@ -95,7 +137,13 @@ void findLetters(Bytes bytes, std::size_t stride, std::vector<FoundIdentity>& fo
         end -= stride - 1;
         const bool hasPlus =
             at >= stride && bytes[at - stride] == '+' && (stride == 1 || bytes[at - 1] == 0);
-        if (const auto kind = kindOf(digits, hasPlus)) {
+        auto kind = kindOf(digits, hasPlus);
+        if (!kind) {
+            const Groups groups = groupsAt(bytes, at, stride);
+            kind = kindOf(groups, hasPlus);
+            end = groups.end;
+        }
+        if (kind) {
             const std::size_t begin = at - (hasPlus ? stride : 0);
             found.push_back(
                 {begin, end - begin, *kind, stride == 1 ? Coding::Text : Coding::Utf16});

@@ -3,14 +3,14 @@
 #include "fields/EventFields.h"
 #include "fields/Measures.h"
 #include "fields/StatusFields.h"
-#include "knowledge/CountryCodes.h"
+#include "overview/StatusNetwork.h"
 #include "overview/StatusWords.h"
 #include "text/Format.h"
 #include "timeline/EventFinder.h"
 
 #include <algorithm>
-#include <array>
 #include <cmath>
+#include <functional>
 #include <utility>
 
 namespace pallax {
@@ -30,11 +30,6 @@ std::string identityText(const FieldValue& value) {
     const std::size_t blank = text.find(' ');
     const bool startsWithNumber = text.find_first_not_of("0123456789") == blank;
     return startsWithNumber ? text.substr(0, blank) : text;
-}
-
-std::string trimmed(std::string text) {
-    text.erase(text.find_last_not_of(' ') + 1);
-    return text;
 }
 
 std::string siteOf(RadioSystem system, const FieldValue& identity) {
@@ -75,7 +70,7 @@ public:
     Status status(const NetworkNames& names) {
         for (const StatusCellFields& rule : statusCells()) {
             if (rule.technology == _fields.technology()) {
-                addCell(rule);
+                rule.isList ? addCellsOfList(rule) : addCell(rule);
             }
         }
         const auto isOld = [this](const StatusNeighbour& neighbour) {
@@ -88,7 +83,7 @@ public:
                                         : one.level.number > other.level.number;
                          });
         addStatesAndContexts();
-        addNetwork(names);
+        _status.network = statusNetworkOf(_values, names);
         return std::move(_status);
     }
 
@@ -128,8 +123,13 @@ private:
                           held.second.text() == condition.text;
                });
     }
+    /// Finds a field's value where a cell is told; null if it names nothing.
+    using Find = std::function<const FieldValue*(std::string_view field)>;
+
     void addCell(const StatusCellFields& rule);
-    void addFields(StatusCell& cell, const StatusCellFields& rule) const;
+    void addCellsOfList(const StatusCellFields& rule);
+    void keep(StatusCell cell);
+    void addFields(StatusCell& cell, const StatusCellFields& rule, const Find& find) const;
     static void addLevel(StatusCell& cell, StatusValue level);
     void addChannel(StatusCell& cell, const StatusCellFields& rule, const FieldValue* band) const;
     void addList(StatusCell& cell, const StatusCellFields& rule, const StatusList& list);
@@ -138,13 +138,6 @@ private:
                                                              const EntryValues& entry) const;
     void addNeighbour(StatusNeighbour neighbour);
     void addStatesAndContexts();
-    bool isTold(const StatusNetworkFields& rule) const {
-        const std::array fields{rule.name, rule.mcc, rule.code, rule.simName, rule.simNetwork};
-        return std::any_of(fields.begin(), fields.end(), [this](std::string_view field) {
-            return !field.empty() && _values.value(field) != nullptr;
-        });
-    }
-    void addNetwork(const NetworkNames& names);
 
     const CurrentValues& _values;
     const FieldTable& _fields;
@@ -161,17 +154,40 @@ void Gathering::addCell(const StatusCellFields& rule) {
     StatusCell cell;
     cell.system = rule.name;
     if (holds(rule.only)) {
-        addFields(cell, rule);
+        addFields(cell, rule, [this](std::string_view field) { return find(field); });
     }
     for (const StatusList& list : rule.lists) {
         addList(cell, rule, list);
     }
+    keep(std::move(cell));
+}
+
+void Gathering::addCellsOfList(const StatusCellFields& rule) {
+    _values.forEachEntry([&](const EntryValues& entry) {
+        if (!holds(rule.only, entry)) {
+            return;
+        }
+        StatusCell cell;
+        cell.system = rule.name;
+        addFields(cell, rule, [&](std::string_view name) -> const FieldValue* {
+            const auto field = _fields.named(name);
+            const FieldValue* value = field ? entry.value(*field) : nullptr;
+            return value != nullptr && tells(*value) ? value : nullptr;
+        });
+        for (StatusValue& level : cell.levels) {
+            level.entry = _values.entries().words(entry.entry);
+        }
+        keep(std::move(cell));
+    });
+}
+
+void Gathering::keep(StatusCell cell) {
     if (!cell.identity.empty() || cell.channel || !cell.levels.empty()) {
         _status.cells.push_back(std::move(cell));
     }
 }
 
-void Gathering::addFields(StatusCell& cell, const StatusCellFields& rule) const {
+void Gathering::addFields(StatusCell& cell, const StatusCellFields& rule, const Find& find) const {
     const FieldValue* band = nullptr;
     for (const StatusField& field : rule.fields) {
         const FieldValue* value = find(field.field);
@@ -346,43 +362,6 @@ void Gathering::addStatesAndContexts() {
                 }
             });
         }
-    }
-}
-
-void Gathering::addNetwork(const NetworkNames& names) {
-    const auto rule =
-        std::find_if(statusNetworks().begin(), statusNetworks().end(), [this](const auto& each) {
-            return each.technology == _fields.technology() && isTold(each);
-        });
-    if (rule == statusNetworks().end()) {
-        return;
-    }
-    const auto textOf = [this](std::string_view field) {
-        const FieldValue* value = field.empty() ? nullptr : _values.value(field);
-        return value != nullptr ? trimmed(value->text()) : std::string();
-    };
-    StatusOperator network;
-    const auto home = NetworkCode::in(textOf(rule->simNetwork));
-    network.code = rule->code.empty() ? NetworkCode::in(textOf(rule->mcc) + " " + textOf(rule->mnc))
-                                      : NetworkCode::in(textOf(rule->code));
-    if (!network.code) {
-        network.code = home;
-        network.isHome = rule->mcc.empty() && rule->code.empty() && home;
-    }
-    const std::string given = textOf(rule->name);
-    const std::string stored = network.code == home ? textOf(rule->simName) : std::string();
-    const NetworkCode code = network.code.value_or(NetworkCode());
-    const auto operators = names.operatorsOf(code, {given, stored});
-    if (!operators.empty()) {
-        network.name = operators.front().name;
-        network.source = operators.front().source;
-    }
-    const auto countries = countryCodesOf(code.mcc);
-    if (!countries.empty()) {
-        network.country = names.countryName(countries.front());
-    }
-    if (network.code || !network.name.empty()) {
-        _status.network = std::move(network);
     }
 }
 

@@ -70,7 +70,7 @@ struct Status {
     Time time;
     std::string profile; ///< the name of the profile that grades
     std::optional<StatusOperator> network;
-    std::vector<StatusCell> cells; ///< one for each system
+    std::vector<StatusCell> cells; ///< serving ones, of one system or several
     std::vector<StatusValue> states;
     /// Those that were read within `kFresh` first, and of these the strongest first.
     std::vector<StatusNeighbour> neighbours;

@@ -34,7 +34,7 @@ std::optional<StatusRole> roleOf(const CurrentValues& values, const FieldInfo& f
         return value != nullptr && value->text() != only.text;
     };
     for (const StatusCellFields& cell : statusCells()) {
-        if (isOther(cell.only)) {
+        if (cell.isList || isOther(cell.only)) {
             continue;
         }
         for (const StatusField& each : cell.fields) {
@@ -115,10 +115,8 @@ std::vector<std::string> knowledgeOf(const CurrentValues& values, const FieldInf
                                      const FieldValue& value, const NetworkNames& names) {
     const auto number = wholeNumber(value.number);
     const auto role = roleOf(values, field);
-    auto system = systemOfChannel(field);
-    if (!system && role && role->role == StatusField::Role::Channel) {
-        system = role->system;
-    }
+    const bool isChannel = role && role->role == StatusField::Role::Channel;
+    const auto system = isChannel ? role->system : systemOfChannel(field);
     if (system && number) {
         return wordsOfChannel(*system, *number);
     }

@@ -49,6 +49,7 @@ ExitStatus record(const RecordOptions& options) {
             return kExitFailure;
         }
         child = std::move(started).value();
+        passOnComplaints(child->takeComplaints()); // what the modem's stream waits for
     }
     std::optional<std::string> failure;
     {

@@ -1,7 +1,9 @@
 #include "sources/ModemStream.h"
 
 #include "host/AsioMainQueue.h"
+#include "host/WallClock.h"
 #include "platform/TelephonyConstants.h"
+#include "sources/modem/ModemBus.h"
 #include "sources/modem/ModemList.h"
 #include "sources/modem/ModemPicture.h"
 #include "sources/modem/ShownText.h"
@@ -23,6 +25,23 @@ constexpr int kLooksBetweenTries = 5;
 constexpr auto kFarewellPatience = 1000ms;
 constexpr auto kStartPatience = 5000ms;
 
+Result<ModemStream::Bus, HostError> openBus(AsioMainQueue& queue) {
+    auto opened = ModemBus::open(queue);
+    if (!opened) {
+        return opened.error();
+    }
+    const std::shared_ptr<ModemBus> bus = std::move(opened).value();
+    return ModemStream::Bus{
+        [bus](const BusCall& call) { return bus->callNow(call); },
+        [bus](const BusCall& call, std::function<void(const BusReply&)> answer) {
+            bus->call(call, std::move(answer));
+        },
+        [bus] { bus->askForObjects(); },
+        [bus](ModemWatch& watch, std::function<void()> lost) {
+            bus->follow(watch, std::move(lost));
+        }};
+}
+
 } // namespace
 
 /// One reader of the stream.
@@ -41,7 +60,7 @@ public:
     }
     void whenReady(std::function<void()> ready) override {
         if (_stream->_messages.count() != _seen) {
-            _stream->_queue.async(std::move(ready));
+            _stream->_setup.queue.async(std::move(ready));
         } else {
             _stream->_waiting.push_back(std::move(ready));
         }
@@ -57,35 +76,43 @@ private:
 
 Result<std::shared_ptr<ModemStream>, HostError>
 ModemStream::open(AsioMainQueue& queue, const LocalModem& modem, const Report& report) {
-    auto bus = ModemBus::open(queue);
+    static const WallClock clock;
+    return open({queue, queue, clock, std::chrono::steady_clock::now,
+                 [&queue] { return pallax::openBus(queue); }},
+                modem, report);
+}
+
+Result<std::shared_ptr<ModemStream>, HostError>
+ModemStream::open(Setup setup, const LocalModem& modem, const Report& report) {
+    auto bus = setup.openBus();
     if (!bus) {
         return bus.error();
     }
-    std::shared_ptr<ModemStream> stream(new ModemStream(queue, modem, std::move(bus).value()));
+    std::shared_ptr<ModemStream> stream(
+        new ModemStream(std::move(setup), modem, std::move(bus).value()));
     if (auto refusal = stream->begin(modem, report)) {
         return std::move(*refusal);
     }
     return stream;
 }
 
-ModemStream::ModemStream(AsioMainQueue& queue, const LocalModem& modem,
-                         std::unique_ptr<ModemBus> bus)
-    : _queue(queue),
+ModemStream::ModemStream(Setup setup, const LocalModem& modem, Bus bus)
+    : _setup(std::move(setup)),
       _watch({[this](const BusCall& call, std::function<void(const BusReply&)> answer) {
-                  if (_bus != nullptr) {
+                  if (_bus) {
                       _bus->call(call, std::move(answer));
                   }
               },
-              std::chrono::steady_clock::now, [this] { _messages.changed(); }, modem.wanted}),
+              _setup.now, [this] { _messages.changed(); }, modem.wanted}),
       _messages(
-          {queue, _clock,
+          {_setup.queue, _setup.clock,
            [this, isWhole = modem.withIdentities] { return pictureOf(_watch.view(), isWhole); },
            [this] { tell(); }}),
       _bus(std::move(bus)) {}
 
 ModemStream::~ModemStream() {
     auto farewell = _watch.farewell();
-    if (farewell && _bus != nullptr) {
+    if (farewell && _bus) {
         farewell->patience = kFarewellPatience;
         (void)_bus->callNow(*farewell);
     }
@@ -107,11 +134,17 @@ std::optional<HostError> ModemStream::begin(const LocalModem& modem, const Repor
     } else if (objects.error().isDenied()) {
         return HostError{"This user may not ask ModemManager: the system bus rejects it."};
     } else {
-        _watch.managerLeft(ModemView::Presence::NoManager);
-        report("ModemManager is not running; Pallax waits for it.");
+        const bool isSilent = objects.error().isUnanswered();
+        _watch.managerLeft(isSilent ? ModemView::Presence::NoAnswer
+                                    : ModemView::Presence::NoManager);
+        report(isSilent ? "ModemManager does not answer; Pallax asks again."
+                        : "ModemManager is not running; Pallax waits for it.");
     }
     _bus->follow(_watch, [this] { lost(); });
-    _looks = _queue.scheduleRepeating(kModemLookInterval, [this] { look(); });
+    if (!objects) {
+        _bus->askForObjects();
+    }
+    _looks = _setup.timers.scheduleRepeating(kModemLookInterval, [this] { look(); });
     look();
     return std::nullopt;
 }
@@ -123,14 +156,14 @@ void ModemStream::lost() {
 }
 
 void ModemStream::look() {
-    if (_bus != nullptr) {
+    if (_bus) {
         _watch.look();
         return;
     }
     if (++_looksWithoutBus % kLooksBetweenTries != 0) {
         return;
     }
-    if (auto opened = ModemBus::open(_queue)) {
+    if (auto opened = _setup.openBus()) {
         _bus = std::move(opened).value();
         _bus->follow(_watch, [this] { lost(); });
         _bus->askForObjects();
@@ -139,7 +172,7 @@ void ModemStream::look() {
 
 void ModemStream::tell() {
     for (auto& ready : std::exchange(_waiting, {})) {
-        _queue.async(std::move(ready));
+        _setup.queue.async(std::move(ready));
     }
 }
 

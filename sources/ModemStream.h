@@ -1,23 +1,23 @@
 #pragma once
 
 #include "host/HostError.h"
-#include "host/WallClock.h"
+#include "platform/RepeatingTimer.h"
 #include "sources/PacketSource.h"
 #include "sources/Source.h"
-#include "sources/modem/ModemBus.h"
+#include "sources/modem/BusCall.h"
 #include "sources/modem/ModemMessages.h"
 #include "sources/modem/ModemWatch.h"
 #include "text/Result.h"
 
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
 namespace pallax {
 
 class AsioMainQueue;
-class RepeatingTimer;
 
 /// A modem of this machine as a live object stream for any number of readers. It goes on while the
 /// modem, ModemManager or the bus is missing, and takes back what it has set at its end.
@@ -25,8 +25,26 @@ class ModemStream : public std::enable_shared_from_this<ModemStream> {
 public:
     using Report = std::function<void(const std::string& sentence)>;
 
-    /// Fails if nothing can be shown, and waiting would not help. The queue must outlive the
-    /// stream.
+    /// A connection to the bus, which ends with the functions: those of ModemBus.
+    struct Bus {
+        std::function<BusReply(const BusCall&)> callNow;
+        BusAsk call;
+        std::function<void()> askForObjects;
+        std::function<void(ModemWatch&, std::function<void()> lost)> follow;
+    };
+    /// What is referred to must outlive the stream.
+    struct Setup {
+        MainQueue& queue;
+        TimerScheduler& timers;
+        const Clock& clock; ///< for the stamps
+        std::function<ModemWatch::SteadyTime()> now;
+        std::function<Result<Bus, HostError>()> openBus;
+    };
+
+    /// Fails if nothing can be shown, and waiting would not help.
+    static Result<std::shared_ptr<ModemStream>, HostError>
+    open(Setup setup, const LocalModem& modem, const Report& report);
+    /// The same, on this machine's system bus. The queue must outlive the stream.
     static Result<std::shared_ptr<ModemStream>, HostError>
     open(AsioMainQueue& queue, const LocalModem& modem, const Report& report);
     ~ModemStream();
@@ -40,17 +58,16 @@ public:
 private:
     class Reader;
 
-    ModemStream(AsioMainQueue& queue, const LocalModem& modem, std::unique_ptr<ModemBus> bus);
+    ModemStream(Setup setup, const LocalModem& modem, Bus bus);
     std::optional<HostError> begin(const LocalModem& modem, const Report& report);
     void lost();
     void look();
     void tell();
 
-    AsioMainQueue& _queue;
-    WallClock _clock;
+    Setup _setup;
     ModemWatch _watch;
     ModemMessages _messages;
-    std::unique_ptr<ModemBus> _bus;              ///< null while there is none
+    std::optional<Bus> _bus;
     std::vector<std::function<void()>> _waiting; ///< readers
     int _looksWithoutBus = 0;
     std::unique_ptr<RepeatingTimer> _looks;

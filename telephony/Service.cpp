@@ -84,9 +84,6 @@ int serve(const ServiceOptions& options, const std::function<void()>& ready,
     std::unique_ptr<TelephonyServer> server;
     int status = 0;
     SourceSurroundings surroundings{queue, complain};
-    if (options.lossless && isLive(options.source)) {
-        surroundings.report = [](const std::string& /*sentence*/) {}; // its viewer shows it
-    }
     if (options.relay) {
         surroundings.relaying = {options.relayPatience, [&](bool isOrderly) {
                                      status = isOrderly ? 0 : 1;

@@ -5,17 +5,27 @@
 #include "text/Counted.h"
 #include "text/Format.h"
 
+#include <algorithm>
+#include <string_view>
 #include <utility>
 
 namespace pallax {
 
 namespace {
 
+/// Whether the options of a section name this program.
+bool isOfRecorder(const CapturePiece& section) {
+    constexpr std::string_view kProgram("\4\0\6\0pallax", 10); // option 4, of 6 bytes
+    return std::search(section.bytes.begin(), section.bytes.end(), kProgram.begin(),
+                       kProgram.end()) != section.bytes.end();
+}
+
 class Checker {
 public:
     void take(const CapturePiece& piece) {
         if (piece.isSection()) {
             _digests.beginSection();
+            _check.isRecorded = isOfRecorder(piece);
             _missing = 0;
             _check.hasEnd = false;
         }
@@ -43,7 +53,8 @@ private:
         if (!block.isRight) {
             _check.faults.push_back(
                 _check.uncovered > 0
-                    ? formatText("packets %llu to %llu have changed", {first, _check.packets})
+                    ? formatText("packets %llu to %llu, or their digest, have changed",
+                                 {first, _check.packets})
                     : formatText("what follows packet %llu has changed", {_check.packets}));
         } else if (block.packets > known) {
             const std::uint64_t missing = block.packets - known;
@@ -57,7 +68,7 @@ private:
         _missing = block.isRight ? block.packets - _digests.packets() : _missing;
         _check.uncovered = 0;
         _check.hasDigests = true;
-        _check.hasEnd = block.isLast;
+        _check.hasEnd = block.isLast && block.isRight;
     }
 
     EmbeddedDigests _digests;

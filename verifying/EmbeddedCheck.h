@@ -15,6 +15,7 @@ struct EmbeddedCheck {
     std::uint64_t packets = 0;
     std::uint64_t uncovered = 0; ///< of them, those at the end that no digest is about
     bool hasDigests = false;
+    bool isRecorded = false;             ///< by `pallax record`, or copied from such a recording
     bool hasEnd = false;                 ///< the recorder has ended it
     std::vector<std::string> faults;     ///< a sentence for each change
     std::optional<RecordingError> error; ///< why it could not be read to its end

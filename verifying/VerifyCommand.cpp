@@ -8,6 +8,7 @@
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
 #include "host/DirectoryResources.h"
+#include "host/EmbeddedDigests.h"
 #include "host/Files.h"
 #include "host/Snapshot.h"
 #include "text/Counted.h"
@@ -109,10 +110,14 @@ ExitStatus VerifyCommand::tell(const std::optional<EmbeddedCheck>& check, const 
         return kExitFailure;
     }
     if (!check->hasDigests) {
-        return couldNotTell(
-            formatText("%@ has no digests: unchanged cannot be told; --update writes some beside "
-                       "it.",
-                       {name}));
+        const bool mayBeKilled =
+            check->isRecorded && check->packets < EmbeddedDigests::kPacketsOfBlock;
+        return couldNotTell(formatText(
+            "%@ has no digests%@: its %@ can be read to the end, but whether they are "
+            "unchanged cannot be told; --update writes some beside it.",
+            {name,
+             mayBeKilled ? " (a recorder that is killed before 1,024 packets leaves none)" : "",
+             counted(check->packets, "packet")}));
     }
     if (check->isWhole()) {
         output.text() +=
@@ -121,7 +126,8 @@ ExitStatus VerifyCommand::tell(const std::optional<EmbeddedCheck>& check, const 
     }
     const std::uint64_t covered = check->packets - check->uncovered;
     output.text() += formatText("%@: packets 1 to %llu are unchanged; ", {name, covered});
-    output.text() += formatText("%@ after them without a digest: the recording has no end\n",
+    output.text() += formatText("%@ after them without a digest: the recorder was killed, or the "
+                                "end is cut off\n",
                                 {counted(check->uncovered, "packet")});
     return kExitCouldNotTell;
 }

@@ -208,7 +208,7 @@ void ModemBus::Connection::askForObjects() {
         }
         if (reply) {
             watch->managerCame(*reply);
-        } else if (!owner.empty()) {
+        } else if (!owner.empty() || reply.error().isUnanswered()) {
             queue.after(kRetry, guarded(&Connection::askForObjects));
         } else {
             watch->managerLeft(ModemView::Presence::NoManager);

@@ -9,7 +9,6 @@ namespace pallax {
 
 namespace {
 
-/// A copy that shares nothing, within the limit.
 Dictionary someOf(const Dictionary& values, std::size_t most) {
     Dictionary some;
     for (const Dictionary::Entry& entry : values) {
@@ -21,15 +20,57 @@ Dictionary someOf(const Dictionary& values, std::size_t most) {
     return some;
 }
 
+std::size_t bytesOf(const Dictionary& values);
+
+/// About what a value takes in memory.
+std::size_t bytesOf(const PropertyList& value) {
+    std::size_t bytes = sizeof(PropertyList);
+    if (const auto text = value.string()) {
+        bytes += text->size();
+    } else if (const DictionaryRef entries = value.dictionary()) {
+        bytes += bytesOf(*entries);
+    } else if (const ArrayRef elements = value.array()) {
+        for (const PropertyList& element : *elements) {
+            bytes += bytesOf(element);
+        }
+    }
+    return bytes;
+}
+
+std::size_t bytesOf(const Dictionary& values) {
+    std::size_t bytes = 0;
+    for (const Dictionary::Entry& entry : values) {
+        bytes += sizeof(Dictionary::Entry) + entry.key.view().size() + bytesOf(entry.value);
+    }
+    return bytes;
+}
+
 } // namespace
 
 void ModemObjects::replace(const PropertyList& objects) {
-    _objects.clear();
+    clear();
     const DictionaryRef told = objects.dictionary();
     for (const Dictionary::Entry& object : told != nullptr ? *told : Dictionary()) {
         if (const DictionaryRef interfaces = object.value.dictionary()) {
             add(object.key.string(), *interfaces);
         }
+    }
+}
+
+void ModemObjects::clear() {
+    _objects.clear();
+    _bytes = 0;
+}
+
+void ModemObjects::put(Dictionary& values, const Dictionary::Entry& entry) {
+    const PropertyList* known = values.find(entry.key.view());
+    const std::size_t name =
+        known != nullptr ? 0 : sizeof(Dictionary::Entry) + entry.key.view().size();
+    const std::size_t before = known != nullptr ? bytesOf(*known) : 0;
+    const std::size_t after = _bytes - before + name + bytesOf(entry.value);
+    if (after <= kMostBytes) {
+        values.set(entry.key, entry.value);
+        _bytes = after;
     }
 }
 
@@ -43,7 +84,7 @@ void ModemObjects::add(const std::string& path, const Dictionary& interfaces) {
         const bool hasRoom =
             object.size() < kMostInterfaces || object.contains(interface.key.view());
         if (properties != nullptr && hasRoom) {
-            object.set(interface.key, someOf(*properties, kMostProperties));
+            put(object, {interface.key, someOf(*properties, kMostProperties)});
         }
     }
     if (object.empty()) {
@@ -56,11 +97,14 @@ void ModemObjects::remove(const std::string& path, const std::vector<std::string
     if (found == _objects.end()) {
         return;
     }
+    _bytes -= bytesOf(found->second);
     for (const std::string& interface : interfaces) {
         (void)found->second.remove(interface);
     }
     if (!found->second.contains(modem_names::kModem)) {
         _objects.erase(found); // the other interfaces belong to this one
+    } else {
+        _bytes += bytesOf(found->second);
     }
 }
 
@@ -74,7 +118,7 @@ bool ModemObjects::change(const std::string& path, const std::string& interface,
     }
     for (const Dictionary::Entry& property : properties) {
         if (known->size() < kMostProperties || known->contains(property.key.view())) {
-            known->set(property.key, property.value);
+            put(*known, property);
         }
     }
     return true;

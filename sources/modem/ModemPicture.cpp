@@ -2,11 +2,12 @@
 
 #include "sources/modem/BusValues.h"
 #include "sources/modem/ModemCells.h"
+#include "sources/modem/ModemIdentities.h"
 #include "sources/modem/ModemLevels.h"
 #include "sources/modem/ModemNames.h"
+#include "sources/modem/ModemSections.h"
 #include "sources/modem/ModemView.h"
 #include "sources/modem/ModemWords.h"
-#include "sources/modem/ShownText.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -20,9 +21,8 @@ namespace pallax {
 namespace {
 
 using namespace bus_values;
+using namespace modem_sections;
 using modem_names::kEnabled;
-
-constexpr std::string_view kUnknown = "unknown";
 
 /// The levels that the interface Signal tells of a system.
 struct SignalGroup {
@@ -99,17 +99,15 @@ public:
                          }));
         picture.setFixed("Neighbour Cells",
                          list([](const ModemCell& cell) { return !cell.isServing; }));
-        picture.setFixed("Data Connections", connections());
-        picture.setFixed("SIM", sim());
-        picture.setFixed("Modem", modem());
+        picture.setFixed("Data Connections", connectionsOf(_view));
+        picture.setFixed("SIM", simOf(_view, _withIdentities));
+        picture.setFixed("Modem", modemOf(_view, _withIdentities));
         return picture;
     }
 
 private:
-    /// Never null.
     DictionaryRef interfaceNamed(std::string_view name) const {
-        const DictionaryRef properties = dictionaryIn(_view.interfaces, name);
-        return properties != nullptr ? properties : std::make_shared<Dictionary>();
+        return modem_sections::interfaceNamed(_view, name);
     }
     bool isThere() const { return _view.presence == ModemView::Presence::There; }
     bool isEnabled() const { return integerIn(*_modem, "State").value_or(0) >= kEnabled; }
@@ -124,38 +122,6 @@ private:
         return serving;
     }
 
-    /// Sets a text of the bus, if there is one.
-    static void add(Dictionary& section, std::string_view key, const Dictionary& values,
-                    std::string_view property) {
-        if (const auto text = textIn(values, property)) {
-            section.setFixed(key, shownText(*text));
-        }
-    }
-    static void addWord(Dictionary& section, std::string_view key, std::string_view word) {
-        if (!word.empty()) {
-            section.setFixed(key, Text::fixed(word));
-        }
-    }
-    static void addNumber(Dictionary& section, std::string_view key, const Dictionary& values,
-                          std::string_view property, const char* format) {
-        if (const auto number = integerIn(values, property); number && *number >= 0) {
-            section.setFixed(key, formatText(format, {*number}));
-        }
-    }
-
-    /// Why nothing is known of the modem.
-    std::string_view absence() const {
-        switch (_view.presence) {
-        case ModemView::Presence::NoBus:
-            return "no system bus";
-        case ModemView::Presence::NoManager:
-            return "ModemManager is not running";
-        case ModemView::Presence::Unplugged:
-            return "unplugged";
-        default:
-            return "no modem";
-        }
-    }
     std::string technologies() const {
         return _technologies.empty() ? std::string(kUnknown) : _technologies;
     }
@@ -172,9 +138,6 @@ private:
     std::string_view whyNoCells() const;
     template <class Wanted>
     Array list(Wanted wanted) const;
-    Array connections() const;
-    Dictionary sim() const;
-    Dictionary modem() const;
 
     const ModemView& _view;
     bool _withIdentities;
@@ -191,7 +154,7 @@ Dictionary Painter::registration() const {
     const auto state = integerIn(*_gpp, "RegistrationState");
     const auto oneX = integerIn(*_cdma, "Cdma1xRegistrationState");
     const auto evdo = integerIn(*_cdma, "EvdoRegistrationState");
-    std::string_view word = isThere() ? kUnknown : absence();
+    std::string_view word = isThere() ? kUnknown : absenceOf(_view);
     if (state) {
         word = modem_words::ofRegistration(*state);
     } else if (oneX.value_or(0) > 0 || evdo.value_or(0) > 0) {
@@ -245,7 +208,7 @@ void Painter::addLevels(Dictionary& section, const SignalGroup& group,
 
 std::string_view Painter::whyNoLevels() const {
     if (!isThere()) {
-        return absence();
+        return absenceOf(_view);
     }
     if (!_view.interfaces.contains(modem_names::kSignal)) {
         return reasonOf(Access::Unsupported);
@@ -280,7 +243,7 @@ Dictionary Painter::signal() const {
 
 std::string_view Painter::whyNoCells() const {
     if (!isThere()) {
-        return absence();
+        return absenceOf(_view);
     }
     if (!isEnabled()) {
         return "the modem is not enabled";
@@ -385,93 +348,11 @@ Array Painter::list(Wanted wanted) const {
     return entries;
 }
 
-Array Painter::connections() const {
-    Array entries{"State, Type"};
-    for (const Dictionary& bearer : _view.bearers) {
-        Dictionary entry;
-        const bool isSuspended = truthIn(bearer, "Suspended").value_or(false);
-        const bool isConnected = truthIn(bearer, "Connected").value_or(false);
-        addWord(entry, "State",
-                isSuspended   ? "suspended"
-                : isConnected ? "connected"
-                              : "not connected");
-        addWord(entry, "Type",
-                modem_words::ofBearerType(integerIn(bearer, "BearerType").value_or(0)));
-        add(entry, "Interface", bearer, "Interface");
-        if (const DictionaryRef wanted = dictionaryIn(bearer, "Properties")) {
-            add(entry, "APN", *wanted, "apn");
-            addWord(entry, "IP Type",
-                    modem_words::ofIpType(integerIn(*wanted, "ip-type").value_or(0)));
-        }
-        if (const DictionaryRef statistics = dictionaryIn(bearer, "Stats")) {
-            addNumber(entry, "Duration", *statistics, "duration", "%lld s");
-            addNumber(entry, "Received", *statistics, "rx-bytes", "%lld bytes");
-            addNumber(entry, "Sent", *statistics, "tx-bytes", "%lld bytes");
-        }
-        entries.emplace_back(std::move(entry));
-    }
-    return entries;
-}
-
-Dictionary Painter::sim() const {
-    Dictionary section;
-    const std::string_view lock =
-        modem_words::ofLock(integerIn(*_modem, "UnlockRequired").value_or(0));
-    const bool isLocked = integerIn(*_modem, "State") == modem_names::kLocked;
-    const auto path = textIn(*_modem, "Sim");
-    std::string_view state = !isThere() ? kUnknown : "none";
-    if (path && *path != modem_names::kNoObject) {
-        state = isLocked ? "locked" : "ready";
-    }
-    addWord(section, "State", state);
-    addWord(section, "Active", truthIn(_view.sim, "Active").value_or(false) ? "yes" : "no");
-    addWord(section, "Lock", isLocked ? lock : std::string_view());
-    add(section, "Operator", _view.sim, "OperatorName");
-    add(section, "Operator Code", _view.sim, "OperatorIdentifier");
-    if (_withIdentities) {
-        add(section, "IMSI", _view.sim, "Imsi");
-        add(section, "ICCID", _view.sim, "SimIdentifier");
-        add(section, "EID", _view.sim, "Eid");
-    }
-    return section;
-}
-
-Dictionary Painter::modem() const {
-    Dictionary section;
-    const auto state = integerIn(*_modem, "State");
-    addWord(section, "State", isThere() ? modem_words::ofState(state.value_or(0)) : absence());
-    section.setFixed("Model", _view.model.empty() ? std::string(kUnknown) : shownText(_view.model));
-    add(section, "Model", *_modem, "Model");
-    add(section, "Manufacturer", *_modem, "Manufacturer");
-    add(section, "Revision", *_modem, "Revision");
-    if (state == modem_names::kFailed) {
-        addWord(section, "Failure",
-                modem_words::ofFailure(integerIn(*_modem, "StateFailedReason").value_or(0)));
-    }
-    if (const auto power = integerIn(*_modem, "PowerState")) {
-        addWord(section, "Power", modem_words::ofPower(*power));
-    }
-    add(section, "Plugin", *_modem, "Plugin");
-    add(section, "Port", *_modem, "PrimaryPort");
-    if (_withIdentities) {
-        add(section, "Equipment ID", *_modem, "EquipmentIdentifier");
-        add(section, "IMEI", *_gpp, "Imei");
-        add(section, "MEID", *_cdma, "Meid");
-        add(section, "ESN", *_cdma, "Esn");
-        const ArrayRef numbers = arrayIn(*_modem, "OwnNumbers");
-        const auto own =
-            numbers != nullptr && !numbers->empty() ? numbers->front().string() : std::nullopt;
-        if (own) {
-            section.setFixed("Own Number", shownText(*own));
-        }
-    }
-    return section;
-}
-
 } // namespace
 
 Dictionary pictureOf(const ModemView& view, bool withIdentities) {
-    return Painter(view, withIdentities).picture();
+    const Dictionary picture = Painter(view, withIdentities).picture();
+    return withIdentities ? picture : withoutIdentities(picture, view);
 }
 
 } // namespace pallax

@@ -19,10 +19,11 @@ enum class Access {
 /// All that is known of one modem. The dictionaries hold properties as the bus told them (see
 /// BusValues.h).
 struct ModemView {
-    enum class Presence { NoBus, NoManager, Waiting, Unplugged, There };
+    enum class Presence { NoBus, NoManager, NoAnswer, Waiting, Unplugged, There };
 
     Presence presence = Presence::Waiting; ///< Waiting: for any modem
     std::string model;                     ///< the latest known, also while the modem is away
+    std::string equipment;                 ///< its number, likewise
     /// By the interface's full name.
     Dictionary interfaces;
     Dictionary sim;

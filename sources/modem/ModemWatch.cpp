@@ -90,9 +90,10 @@ void ModemWatch::choose() {
 }
 
 void ModemWatch::forgetModem() {
-    std::string model = std::move(_view.model);
-    _view = ModemView();
-    _view.model = std::move(model);
+    ModemView view;
+    view.model = std::move(_view.model);
+    view.equipment = std::move(_view.equipment);
+    _view = std::move(view);
     _path.clear();
     _simPath.clear();
     _bearerPaths.clear();
@@ -116,6 +117,7 @@ void ModemWatch::readModem() {
     _view.interfaces = *_objects.find(_path);
     if (const DictionaryRef modem = dictionaryIn(_view.interfaces, kModem)) {
         _view.model = textIn(*modem, "Model").value_or(_view.model);
+        _view.equipment = textIn(*modem, "EquipmentIdentifier").value_or(_view.equipment);
     }
     readSim();
     readBearers();

@@ -4,10 +4,53 @@
 namespace pallax {
 namespace {
 
+using doubles::eventually;
+using doubles::PallaxProcess;
+
 /// A viewer that shows nothing that identifies a person.
 class EndToEndSafe : public EndToEndScreen {
 protected:
     static constexpr const char* kIccid = "8949020000012345670";
+    static constexpr const char* kCopiedIccid = "ODk0OTAyMDAwMDAxMjM0NTY3MA=="; ///< in base64
+
+    /// Nothing that the terminal has got from there on, copied texts included, is of the identity.
+    static void expectNoIdentity(const PallaxTerminal& terminal, std::size_t from = 0) {
+        const std::string bytes = terminal.bytes().substr(from);
+        EXPECT_EQ(bytes.find("0123456"), std::string::npos);
+        EXPECT_EQ(bytes.find(kCopiedIccid), std::string::npos);
+    }
+    /// Opens the section with the cursor on the ICCID.
+    static void openIccid(PallaxTerminal& terminal) {
+        terminal.type("/sim info\r");
+        ASSERT_TRUE(terminal.shows("1 of 26"));
+        terminal.type("\r/iccid\r");
+        ASSERT_TRUE(terminal.shows("▌EF-ICCID"));
+    }
+    /// Looks at the ICCID in every way that has keys: copies it, explains it, puts it into a graph,
+    /// finds it in a frame and in the recording, lists events and asks in SQL.
+    static void useEveryKey(PallaxTerminal& terminal) {
+        terminal.type("y");
+        ASSERT_TRUE(terminal.shows("Copied: 0000000000000000000"));
+        terminal.type("i");
+        ASSERT_TRUE(terminal.shows("EF-ICCID"));
+        terminal.type(std::string("y") + kEscape + "vV");
+        (void)terminal.settled();
+        terminal.type(kEscape);
+        terminal.type("f8949");
+        ASSERT_TRUE(terminal.shows("Find in this frame"));
+        (void)terminal.settled();
+        terminal.type("\t");
+        ASSERT_TRUE(terminal.shows("Find in the whole recording"));
+        (void)terminal.settled();
+        terminal.type(std::string(kEscape) + kEscape + "e");
+        (void)terminal.settled();
+        terminal.type(kEscape);
+        terminal.type(";select distinct text from sample where field like '%iccid'\r");
+        ASSERT_TRUE(terminal.shows("1 row"));
+        terminal.type(std::string("y") + kEscape + "m,d");
+        (void)terminal.settled();
+        terminal.type(std::string(kEscape) + "$");
+    }
 
     std::string withSim() const {
         using std::chrono::milliseconds;
@@ -100,6 +143,81 @@ TEST_F(EndToEndSafe, NoKeyUndoesTheOption) {
     EXPECT_TRUE(terminal.shows("The viewer was started with --safe and stays so."));
     terminal.type("j");
     EXPECT_TRUE(terminal.shows("safe"));
+}
+
+TEST_F(EndToEndSafe, NothingThatTheTerminalGetsIsAnIdentity) {
+    PallaxTerminal terminal(world, {withSim(), "--safe", "--speed", "max"}, {100, 30});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    openIccid(terminal);
+    useEveryKey(terminal);
+    terminal.type("R"); // starts afresh
+    (void)terminal.settled();
+    expectNoIdentity(terminal);
+}
+
+TEST_F(EndToEndSafe, NothingThatTheTerminalGetsAfterTheKeyIsAnIdentity) {
+    PallaxTerminal terminal(world, {withSim(), "--speed", "max"}, {100, 30});
+    ASSERT_TRUE(terminal.shows("End of the recording"));
+    openIccid(terminal);
+    ASSERT_TRUE(terminal.shows(kIccid));
+    terminal.type("y");
+    ASSERT_TRUE(terminal.shows(std::string("Copied: ") + kIccid));
+    EXPECT_NE(terminal.bytes().find(kCopiedIccid), std::string::npos);
+    terminal.type("mvix"); // marked, in a graph, and on the page of a value
+    ASSERT_TRUE(terminal.showsNoMore(kIccid));
+    ASSERT_TRUE(terminal.shows("safe"));
+    (void)terminal.settled();
+    const std::size_t begin = terminal.bytes().size();
+    openIccid(terminal);
+    useEveryKey(terminal);
+    terminal.type("s");
+    ASSERT_TRUE(terminal.shows("Save snapshot"));
+    terminal.type("\r\r");
+    ASSERT_TRUE(terminal.shows("Saved " + snapshots));
+    expectNoIdentity(terminal, begin);
+    const auto saved = filesIn(snapshots);
+    ASSERT_EQ(saved.size(), 1U);
+    EXPECT_EQ(contentOf(saved.front()).find("0123456"), std::string::npos);
+    EXPECT_EQ(run({"mask", "--check", saved.front()}).status, 0);
+}
+
+TEST_F(EndToEndSafe, TheKeyHidesTheIdentitiesOfAllModems) {
+    const std::string recording = withSim();
+    const PallaxProcess one(world, {"service", "--name", "one", "--play", recording, "--loop"});
+    const PallaxProcess other(world, {"service", "--name", "other", "--play", recording, "--loop"});
+    ASSERT_TRUE(eventually([this] { return run({"service", "--list"}).out == "one\nother\n"; }));
+    PallaxTerminal terminal(world, {"--connect", "one", "--connect", "other"}, {160, 24});
+    ASSERT_TRUE(terminal.shows("Zorell_GSM · other"));
+    const auto openBoth = [&terminal] {
+        for (const char* modem : {"1", "2"}) {
+            terminal.type(std::string(modem) + "/sim info\r");
+            ASSERT_TRUE(terminal.shows("1 of 26"));
+            terminal.type("\r");
+            ASSERT_TRUE(terminal.showsNoMore("1 of 26"));
+        }
+    };
+    openBoth();
+    const auto identities = [&terminal] {
+        const std::string text = terminal.screen().text();
+        int count = 0;
+        for (auto at = text.find(kIccid); at != std::string::npos; at = text.find(kIccid, at + 1)) {
+            ++count;
+        }
+        return count;
+    };
+    ASSERT_TRUE(terminal.shows(kIccid));
+    ASSERT_TRUE(eventually([&] {
+        (void)terminal.settled();
+        return identities() == 2;
+    }));
+    terminal.type("x");
+    ASSERT_TRUE(terminal.showsNoMore(kIccid));
+    (void)terminal.settled();
+    const std::size_t begin = terminal.bytes().size();
+    openBoth();
+    ASSERT_TRUE(terminal.shows("0000000000000000000"));
+    (void)terminal.settled();
+    expectNoIdentity(terminal, begin);
 }
 
 TEST_F(EndToEndSafe, WithoutItTheIdentityIsShown) {

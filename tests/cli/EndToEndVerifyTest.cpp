@@ -41,9 +41,10 @@ TEST_F(EndToEndVerify, TellsThatARecordingIsWhatItWas) {
     const std::string file = gsmAttach();
     const Run unknown = run({"verify", file});
     EXPECT_EQ(unknown.status, 3);
-    EXPECT_EQ(unknown.err, "pallax: " + file +
-                               " has no digests: unchanged cannot be told; --update writes some "
-                               "beside it.\n");
+    EXPECT_EQ(unknown.err,
+              "pallax: " + file +
+                  " has no digests: its 51 packets can be read to the end, but whether they are "
+                  "unchanged cannot be told; --update writes some beside it.\n");
     EXPECT_EQ(run({"verify", "--update", file}).status, 0);
     const Run same = run({"verify", file});
     EXPECT_EQ(same.status, 0);
@@ -70,7 +71,7 @@ TEST_F(EndToEndVerify, ARecorderWritesWhatItNeedsToKnow) {
     const std::string damaged = write("damaged.pcapng", content);
     const Run changed = run({"verify", damaged});
     EXPECT_EQ(changed.status, 1);
-    EXPECT_EQ(changed.out, damaged + ": packets 1 to 1024 have changed\n");
+    EXPECT_EQ(changed.out, damaged + ": packets 1 to 1024, or their digest, have changed\n");
     EXPECT_EQ(run({"verify", "--update", damaged}).status, 1) << "damage is not what is expected";
 }
 
@@ -88,8 +89,18 @@ TEST_F(EndToEndVerify, WhatAKilledRecorderLeavesIsKnownUpToItsLastDigest) {
         write("killed.pcapng", content.substr(0, content.size() - 68)); // without its end
     const Run killed = run({"verify", file});
     EXPECT_EQ(killed.status, 3);
-    EXPECT_EQ(killed.out, file + ": packets 1 to 1024 are unchanged; 476 packets after them "
-                                 "without a digest: the recording has no end\n");
+    EXPECT_EQ(killed.out, file +
+                              ": packets 1 to 1024 are unchanged; 476 packets after them "
+                              "without a digest: the recorder was killed, or the end is cut off\n");
+    const std::string early = doubles::contentOf(recorded(20, {"--overwrite"}));
+    const std::string none = write("early.pcapng", early.substr(0, early.size() - 68));
+    const Run unknown = run({"verify", none});
+    EXPECT_EQ(unknown.status, 3);
+    EXPECT_EQ(unknown.err, "pallax: " + none +
+                               " has no digests (a recorder that is killed before 1,024 packets "
+                               "leaves none): its 20 packets can be read to the end, but whether "
+                               "they are unchanged cannot be told; --update writes some beside "
+                               "it.\n");
 }
 
 TEST_F(EndToEndVerify, AMaskedCopyIsWholeAndAMaskedDamageIsNot) {
@@ -107,7 +118,8 @@ TEST_F(EndToEndVerify, AMaskedCopyIsWholeAndAMaskedDamageIsNot) {
                               copy + ", too.\n"),
               std::string::npos)
         << masked.err;
-    EXPECT_EQ(run({"verify", copy}).out, copy + ": packets 1 to 1024 have changed\n");
+    EXPECT_EQ(run({"verify", copy}).out,
+              copy + ": packets 1 to 1024, or their digest, have changed\n");
 }
 
 TEST_F(EndToEndVerify, OtherReadersSkipTheDigests) {

@@ -122,9 +122,15 @@ TEST(FieldRegistry, KnowsWhichCellAnEntryIs) {
 }
 
 TEST(FieldRegistry, KnowsTheIdentityOfEveryList) {
-    const std::vector<std::string> ofAnySystem{
-        "arfcn", "bsic", "uarfcn", "earfcn", "nr_arfcn", "scrambling_code", "physical_cell_id",
-        "pn"};
+    const std::vector<std::string> ofAnySystem{"arfcn",
+                                               "bsic",
+                                               "uarfcn",
+                                               "earfcn",
+                                               "nr_arfcn",
+                                               "scrambling_code",
+                                               "cell_parameter_id",
+                                               "physical_cell_id",
+                                               "pn"};
     EXPECT_EQ(identitiesIn("ifx"), (Identities{
                                        {"/Barred Cells/*", {"barred_cells"}},
                                        {"/Data Connections/*", {}},

@@ -47,7 +47,7 @@ protected:
 TEST_F(StatusFieldsTest, AreInTheRegistry) {
     for (const StatusCellFields& cell : statusCells()) {
         for (const StatusField& field : cell.fields) {
-            expectField(cell.technology, field.field, false);
+            expectField(cell.technology, field.field, cell.isList);
         }
         for (const StatusList& list : cell.lists) {
             expectField(cell.technology, list.level, true);

@@ -82,6 +82,26 @@ TEST(StatusText, FitsTenLinesOfEightyColumnsAndKeepsTheProfile) {
     EXPECT_NE(text.find("…\n"), std::string::npos) << text;
 }
 
+TEST(StatusText, TellsHowManyCellsItLeavesOut) {
+    Status status = emptyStatus();
+    status.network = StatusOperator{NetworkCode{"262", "42"}, "Net", "", NameSource::Sim, false};
+    for (const char* pci : {"1", "2", "3", "4"}) {
+        status.cells.push_back(
+            {"LTE", "", {value("PCI", pci)}, {}, "", {}, {value("RSRP", "-90")}});
+    }
+    status.states = {value("modem", "registered")};
+    status.neighbours.push_back({"LTE", "PCI 9", value("RSRP", "1")});
+    status.contexts = {{"ims", ""}};
+    EXPECT_NE(textOf(status).find("LTE cell    PCI 4\nlevels "), std::string::npos);
+    for (int more = 0; more < 60; ++more) {
+        status.cells.push_back(status.cells.front());
+    }
+    const std::string text = textOf(status);
+    EXPECT_NE(text.find("LTE cell    PCI 3\ncells       61 more\nlevels "), std::string::npos)
+        << text;
+    EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 10) << text;
+}
+
 TEST(StatusText, OfAnyPacketsFits) {
     const NetworkNames names;
     const QualityProfile profile = *builtInProfile(kDefaultProfile);

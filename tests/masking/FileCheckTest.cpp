@@ -1,4 +1,5 @@
 #include "console/Output.h"
+#include "host/PcapNgWriter.h"
 #include "host/RecordingWriter.h"
 #include "masking/CheckCommand.h"
 #include "masking/MaskCommand.h"
@@ -63,6 +64,21 @@ TEST_F(FileCheckTest, AnyOtherFileIsSearchedAsItsBytes) {
     EXPECT_EQ(text, path + ": byte 5: phone number in text\n");
     EXPECT_EQ(check(folder.write("note.txt", "nothing here")), kExitSuccess);
     EXPECT_EQ(text, "");
+}
+
+TEST_F(FileCheckTest, ADigestHidesNothing) {
+    const std::string path = folder.path("recorded.pcapng");
+    {
+        const auto writer = PcapNgWriter::create(path, PcapNgWriter::Existing::Overwrite);
+        ASSERT_FALSE((*writer)->begin(150, "Zorell_LTE"));
+        ASSERT_FALSE((*writer)->write(kSampleStart, doubles::Record(0xB000).bytes()));
+        ASSERT_FALSE((*writer)->finish());
+    }
+    EXPECT_EQ(check(path), kExitSuccess) << text;
+    std::string content = doubles::contentOf(path);
+    content.replace(content.size() - 30, 16, " 262011234567890");
+    EXPECT_EQ(check(folder.write("recorded.pcapng", content)), kExitFailure);
+    EXPECT_TRUE(text.ends_with(": IMSI in text\n")) << text;
 }
 
 TEST_F(FileCheckTest, AFileThatCannotBeReadIsAFailure) {

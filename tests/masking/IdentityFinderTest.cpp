@@ -2,6 +2,8 @@
 
 #include "tests/masking/MaskFixture.h"
 
+#include <gtest/gtest.h>
+
 #include <string>
 
 namespace pallax {
@@ -47,6 +49,21 @@ TEST(IdentityFinder, FindsPhoneNumbersInInternationalForm) {
     EXPECT_EQ(found("+491511"), "") << "too short";
     EXPECT_EQ(found("+0015112345678"), "");
     EXPECT_EQ(found("4915112345678"), "");
+}
+
+TEST(IdentityFinder, FindsDigitsInGroups) {
+    EXPECT_EQ(found("tel:+49 151 1234-5678,"), "4+17 phone number in text");
+    EXPECT_EQ(found("49-015420-323751-8"), "0+18 IMEI in text");
+    EXPECT_EQ(found("490154-20-323751-8 "), "0+18 IMEI in text");
+    EXPECT_EQ(found("49-015420-323751-7"), "") << "its check digit is wrong";
+    EXPECT_EQ(found("4901-5420-3237-518"), "") << "nobody writes it so";
+    EXPECT_EQ(found("+49 151  12345678"), "") << "two blanks";
+    EXPECT_EQ(found("151 1234 5678"), "");
+    ByteBuffer wide;
+    for (const char letter : std::string("+49 151 12345678")) {
+        wide.insert(wide.end(), {static_cast<std::uint8_t>(letter), 0});
+    }
+    EXPECT_EQ(found(wide), "0+31 phone number in UTF-16");
 }
 
 TEST(IdentityFinder, FindsUtf16OfEitherByteOrder) {

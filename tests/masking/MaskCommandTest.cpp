@@ -174,6 +174,40 @@ TEST_F(MaskCommandTest, WithCoarsePlacesTheSameCellHasTheSameTokenInAllFiles) {
     EXPECT_NE(doubles::contentOf(output), first);
 }
 
+TEST_F(MaskCommandTest, CoarsePlacesOfARealModemAreInAllItsSections) {
+    const MaskOptions options{.files = {sample("modem-mbim.pcapng")},
+                              .output = output,
+                              .choice = {.coarsePlace = true},
+                              .keyFile = key("sixteen bytes ok")};
+    ASSERT_EQ(mask(options), kExitSuccess);
+    const std::string before = doubles::contentOf(sample("modem-mbim.pcapng"));
+    const std::string after = doubles::contentOf(output);
+    for (const char* place : {"33997", "1382843", "11183", "4886718346"}) { // areas and cells
+        EXPECT_NE(before.find(place), std::string::npos) << place;
+        EXPECT_EQ(after.find(place), std::string::npos) << place;
+    }
+}
+
+TEST_F(MaskCommandTest, AddressesOfAnInterfaceAreZeros) {
+    using namespace std::string_literals;
+    const std::string file = folder.path("a.pcapng");
+    {
+        const auto writer = PcapNgWriter::create(file, PcapNgWriter::Existing::Overwrite);
+        ASSERT_FALSE((*writer)->begin(150, "Zorell_LTE"));
+        ASSERT_FALSE((*writer)->write(kSampleStart, {}));
+    }
+    // An interface block: its name (2), MAC address (6), the end of its options.
+    const std::string interface = "\1\0\0\0\x2C\0\0\0\x96\0\0\0\0\0\0\0"
+                                  "\2\0\4\0wwan\6\0\6\0\2\x42\x99\x17\x2A\x5E\0\0\0\0\0\0"
+                                  "\x2C\0\0\0"s;
+    const std::string before = doubles::contentOf(file) + interface;
+    (void)folder.write("a.pcapng", before);
+    ASSERT_EQ(mask({.files = {file}, .output = output}), kExitSuccess);
+    const std::string after = doubles::contentOf(output);
+    EXPECT_NE(after.find("wwan\6\0\6\0\0\0\0\0\0\0"s), std::string::npos);
+    EXPECT_EQ(differences(before, after), 6U);
+}
+
 TEST_F(MaskCommandTest, AFileOfAnotherKindHasNoCopy) {
     const std::string file = folder.write("text", "<html>");
     EXPECT_EQ(mask({.files = {file}, .output = output}), kExitFailure);

@@ -188,6 +188,88 @@ TEST(Status, OfCdmaTheBandClassDecidesTheFrequency) {
     EXPECT_EQ(linesOf(status.neighbours), (Lines{"1x PN 9 -9.00 dB", "EV-DO PN 9 -9.00 dB"}));
 }
 
+TEST(Status, EachFurtherServingCellIsACell) {
+    ValuesFixture ifx("ifx");
+    ifx.read(0, {{"Serving Cell", Dictionary{{"Technology", "LTE"},
+                                             {"Cell ID", "13828439"},
+                                             {"EARFCN", "1850"},
+                                             {"Physical Cell ID", "121"},
+                                             {"RSRP", "-104.0 dBm"}}},
+                 {"Further Serving Cells", Array{Dictionary{{"Technology", "LTE"},
+                                                            {"EARFCN", "6300"},
+                                                            {"Physical Cell ID", "44"},
+                                                            {"RSRP", "-99.0 dBm"}},
+                                                 Dictionary{{"Technology", "NR"},
+                                                            {"Cell ID", "4886718346"},
+                                                            {"TAC", "33997"},
+                                                            {"NR-ARFCN", "640000"},
+                                                            {"Physical Cell ID", "501"},
+                                                            {"RSRP", "-94.0 dBm"},
+                                                            {"SINR", "-3.0 dB"}}}}});
+    const Status status = statusAt(0, ifx);
+    ASSERT_EQ(status.cells.size(), 3U);
+    EXPECT_EQ(status.cells[0].site, "eNodeB 54017 sector 87");
+    EXPECT_EQ(status.cells[1].system, "LTE");
+    EXPECT_EQ(linesOf(status.cells[1].identity), Lines{"PCI 44"});
+    EXPECT_EQ(status.cells[1].band, "20");
+    EXPECT_EQ(linesOf(status.cells[1].levels), Lines{"RSRP -99.0 dBm good"});
+    EXPECT_EQ(status.cells[1].levels[0].entry, "EARFCN 6300, Physical Cell ID 44");
+    EXPECT_EQ(status.cells[2].system, "NR");
+    EXPECT_EQ(linesOf(status.cells[2].identity),
+              (Lines{"cell 4886718346", "PCI 501", "TAC 33997"}));
+    EXPECT_EQ(status.cells[2].site, "cell 4886718346");
+    EXPECT_EQ(status.cells[2].band, "n48/n77/n78");
+    EXPECT_EQ(status.cells[2].megahertz, 3600.0);
+    EXPECT_EQ(linesOf(status.cells[2].levels),
+              (Lines{"RSRP -94.0 dBm excellent", "SINR -3.0 dB poor"}));
+    EXPECT_TRUE(status.neighbours.empty());
+}
+
+TEST(Status, ATdScdmaCellHasItsNeighboursAndFrequency) {
+    ValuesFixture ifx("ifx");
+    ifx.read(0, {{"Serving Cell", Dictionary{{"Technology", "TD-SCDMA"},
+                                             {"LAC", "33997"},
+                                             {"Cell ID", "13828439"},
+                                             {"UARFCN", "10054"},
+                                             {"Cell Parameter ID", "17"},
+                                             {"RSCP", "-85.0 dBm"}}},
+                 {"Neighbour Cells", Array{Dictionary{{"Technology", "TD-SCDMA"},
+                                                      {"UARFCN", "10054"},
+                                                      {"Cell Parameter ID", "18"},
+                                                      {"RSCP", "-90.0 dBm"}},
+                                           Dictionary{{"Technology", "UMTS"},
+                                                      {"UARFCN", "10713"},
+                                                      {"Scrambling Code", "212"},
+                                                      {"RSCP", "-97.0 dBm"}}}}});
+    const Status status = statusAt(0, ifx);
+    ASSERT_EQ(status.cells.size(), 1U);
+    EXPECT_EQ(status.cells[0].system, "TD-SCDMA");
+    EXPECT_EQ(status.cells[0].site, "RNC 211 cell 343");
+    EXPECT_EQ(linesOf(status.cells[0].identity), (Lines{"cell 13828439", "CPID 17", "LAC 33997"}));
+    EXPECT_EQ(status.cells[0].megahertz, 2010.8);
+    EXPECT_EQ(linesOf(status.cells[0].levels), Lines{"RSCP -85.0 dBm excellent"});
+    EXPECT_EQ(linesOf(status.neighbours), (Lines{"TD-SCDMA UARFCN 10054 CPID 18 -90.0 dBm",
+                                                 "UMTS UARFCN 10713 PSC 212 -97.0 dBm"}));
+}
+
+TEST(Status, ACdmaCellOfAModemHasItsNeighbours) {
+    ValuesFixture ifx("ifx");
+    ifx.read(0,
+             {{"Serving Cell", Dictionary{{"Technology", "CDMA"},
+                                          {"SID", "4139"},
+                                          {"NID", "65535"},
+                                          {"Base Station ID", "601"},
+                                          {"PN", "28"},
+                                          {"Ec/Io", "-8.0 dB"}}},
+              {"Neighbour Cells",
+               Array{Dictionary{{"Technology", "CDMA"}, {"PN", "117"}, {"Ec/Io", "-14.0 dB"}}}}});
+    const Status status = statusAt(0, ifx);
+    ASSERT_EQ(status.cells.size(), 1U);
+    EXPECT_EQ(linesOf(status.cells[0].identity),
+              (Lines{"cell 601", "PN 28", "NID 65535", "SID 4139"}));
+    EXPECT_EQ(linesOf(status.neighbours), Lines{"CDMA PN 117 -14.0 dB"});
+}
+
 TEST(Status, ANameOfTheNetworkComesFirst) {
     ValuesFixture ifx("ifx");
     ifx.read(0, {{"Network", Dictionary{{"Name", "Own Name"}, {"MCC", "262"}, {"MNC", "01"}}}});
@@ -197,6 +279,21 @@ TEST(Status, ANameOfTheNetworkComesFirst) {
     EXPECT_EQ(network->source, NameSource::Network);
     EXPECT_EQ(network->country, "Germany");
     EXPECT_FALSE(network->isHome);
+}
+
+TEST(Status, AModemThatIsNotRegisteredHasTheNetworkOfItsSim) {
+    const auto operatorOf = [](const Dictionary& registration) {
+        ValuesFixture ifx("ifx");
+        ifx.read(0, {{"Registration", registration},
+                     {"SIM", Dictionary{{"Operator", "Home"}, {"Operator Code", "26242"}}}});
+        return *statusAt(0, ifx).network;
+    };
+    const auto searching = operatorOf({{"State", "searching"}, {"Technology", "unknown"}});
+    EXPECT_EQ(searching.name, "Home");
+    EXPECT_TRUE(searching.isHome);
+    const auto roaming = operatorOf({{"State", "roaming"}, {"Operator Code", "26201"}});
+    EXPECT_EQ(roaming.name, "Netz");
+    EXPECT_FALSE(roaming.isHome);
 }
 
 TEST(Status, TheNameInTheSimIsThatOfItsOwnNetworkOnly) {

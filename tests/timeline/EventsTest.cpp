@@ -166,6 +166,31 @@ TEST_F(EventsTest, ServiceIsLostAndRegained) {
                                "22 s service-regained: service regained after 12 s"}));
 }
 
+TEST_F(EventsTest, CellsOfTdScdmaAndCdmaChange) {
+    const auto tdScdma = [](const char* channel, const char* cell) {
+        return *serializeBinary(
+            Dictionary{{"Serving Cell", Dictionary{{"Technology", "TD-SCDMA"},
+                                                   {"UARFCN", channel},
+                                                   {"Cell Parameter ID", cell}}},
+                       {"Signal", Dictionary{{"Quality", "unknown"}}}});
+    };
+    use("ifx");
+    add(0, tdScdma("10054", "17"));
+    add(10, tdScdma("10054", "18"));
+    add(20, tdScdma("10062", "18"));
+    EXPECT_EQ(events(), (Lines{"10 s cell-change: serving cell 17 → 18 after 10 s",
+                               "20 s cell-change: serving cell 18/10054 → 18/10062 after 10 s"}));
+    const auto cdma = [](const char* pilot) {
+        return *serializeBinary(
+            Dictionary{{"Serving Cell", Dictionary{{"Technology", "CDMA"}, {"PN", pilot}}},
+                       {"Signal", Dictionary{{"Quality", "unknown"}}}});
+    };
+    use("ifx");
+    add(0, cdma("28"));
+    add(10, cdma("117"));
+    EXPECT_EQ(events(), Lines{"10 s cell-change: serving cell 28 → 117 after 10 s"});
+}
+
 TEST_F(EventsTest, GapsAndStepsOfTime) {
     use("lte");
     add(100, lteCell(150));

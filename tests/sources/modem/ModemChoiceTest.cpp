@@ -70,27 +70,5 @@ TEST(ModemChoiceTest, AThousandModems) {
     EXPECT_EQ(chosen(objects, "auto"), "999");
 }
 
-TEST(ModemObjectsTest, WhatIsBeyondTheLimitsIsDropped) {
-    ModemObjects objects;
-    Dictionary wide;
-    for (int index = 0; index < 1000; ++index) {
-        wide.set(Text("Property" + std::to_string(index)), number(index));
-    }
-    Dictionary interfaces;
-    interfaces.set(modem_names::kModem, wide);
-    objects.add(std::string(kFolder) + "0", interfaces);
-    EXPECT_EQ(
-        objects.find(std::string(kFolder) + "0")->find(modem_names::kModem)->dictionary()->size(),
-        ModemObjects::kMostProperties);
-    objects.change(std::string(kFolder) + "0", modem_names::kModem, {{"Another", number(1)}});
-    EXPECT_EQ(
-        objects.find(std::string(kFolder) + "0")->find(modem_names::kModem)->dictionary()->size(),
-        ModemObjects::kMostProperties);
-    for (std::size_t index = 0; index < ModemObjects::kMostObjects + 10; ++index) {
-        objects.add(kFolder + std::to_string(index), interfacesOfLte());
-    }
-    EXPECT_EQ(objects.modems().size(), ModemObjects::kMostObjects);
-}
-
 } // namespace
 } // namespace pallax

@@ -97,6 +97,25 @@ TEST(ModemPictureTest, IdentitiesAreShownOnlyOnRequest) {
     EXPECT_EQ(text(section(view, "Modem", true), "Own Number"), "+4915112345678");
 }
 
+TEST(ModemPictureTest, AnIdentityWithinAnotherTextIsZeros) {
+    ModemView view = lteView();
+    Dictionary modem = lteModem("/sys/devices/usb1", "AT-9 490154203237518");
+    modem.set("Revision", "1.0 for 4915112345678, 4915112345678");
+    view.interfaces.set(modem_names::kModem, modem);
+    view.model = "AT-9 490154203237518";
+    view.bearers = {Dictionary{{"Properties", Dictionary{{"apn", "262420123456789.example"}}}}};
+    EXPECT_EQ(text(section(view, "Modem"), "Model"), "AT-9 000000000000000");
+    EXPECT_EQ(text(section(view, "Modem"), "Revision"), "1.0 for 0000000000000, 0000000000000");
+    const std::string without = PropertyList(pictureOf(view, false)).description();
+    EXPECT_NE(without.find("000000000000000.example"), std::string::npos) << without;
+    EXPECT_EQ(text(section(view, "Modem", true), "Model"), "AT-9 490154203237518");
+    ModemView away;
+    away.presence = ModemView::Presence::Unplugged;
+    away.model = view.model;
+    away.equipment = "490154203237518";
+    EXPECT_EQ(text(section(away, "Modem"), "Model"), "AT-9 000000000000000");
+}
+
 TEST(ModemPictureTest, TheServingCellIsThePrimaryOne) {
     ModemView view = lteView();
     view.cellAccess = Access::Granted;
@@ -151,6 +170,7 @@ TEST(ModemPictureTest, AMissingModemIsToldInEverySection) {
     for (const auto& [presence, words] :
          {std::pair(ModemView::Presence::NoBus, "no system bus"),
           std::pair(ModemView::Presence::NoManager, "ModemManager is not running"),
+          std::pair(ModemView::Presence::NoAnswer, "ModemManager does not answer"),
           std::pair(ModemView::Presence::Waiting, "no modem"),
           std::pair(ModemView::Presence::Unplugged, "unplugged")}) {
         ModemView view;

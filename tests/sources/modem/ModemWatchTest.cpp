@@ -269,11 +269,13 @@ TEST_F(ModemWatchTest, TheModelStaysKnownWhileTheModemIsAway) {
     ModemWatch& watch = withModem();
     const std::string model = watch.view().model;
     EXPECT_FALSE(model.empty());
+    EXPECT_EQ(watch.view().equipment, "490154203237518");
     watch.interfacesRemoved(kPath, {"org.freedesktop.ModemManager1.Modem"});
     EXPECT_EQ(watch.view().presence, ModemView::Presence::Unplugged);
     EXPECT_EQ(watch.view().model, model);
     watch.managerLeft(ModemView::Presence::NoManager);
     EXPECT_EQ(watch.view().model, model);
+    EXPECT_EQ(watch.view().equipment, "490154203237518") << "which the model may hold";
 }
 
 } // namespace

@@ -228,10 +228,26 @@ TEST_F(ModemWorld, WithoutABusOrModemManagerOneSentenceTellsIt) {
         "$PALLAX" modem --list; echo "status $?"
         begin_pallax modem --print
         shows "Modem/State: ModemManager is not running"
+        end_pallax
+        begin_pallax record --modem "$folder/drive.pcapng"
+        succeeds "[ -s $folder/err ]"
         end_pallax)steps");
     EXPECT_EQ(noManager.out, "pallax: ModemManager is not running.\n"
                              "status 1\n"
-                             "Modem/State: ModemManager is not running\n");
+                             "Modem/State: ModemManager is not running\n"
+                             "pallax: ModemManager is not running; Pallax waits for it.\n");
+}
+
+TEST_F(ModemWorld, AModemManagerThatHangsIsAskedAgain) {
+    const auto run = in("at-world", R"steps(
+        manager=$(modem_manager_pid)
+        kill -STOP $manager
+        begin_pallax record --modem "$folder/drive.pcapng"
+        succeeds "[ -s $folder/err ]"
+        kill -CONT $manager
+        succeeds "grep -q SampleNet $folder/drive.pcapng"
+        end_pallax)steps");
+    EXPECT_EQ(run.out, "pallax: ModemManager does not answer; Pallax asks again.\n");
 }
 
 TEST_F(ModemWorld, AMockOfACdmaModemAndOfOneThatTellsNrCells) {

@@ -47,6 +47,18 @@ shows() {
     echo "$1"
 }
 
+# succeeds COMMAND: waits until it does.
+succeeds() {
+    local end=$((SECONDS + 20))
+    until eval "$1"; do
+        if [ $SECONDS -ge $end ]; then
+            echo "failed: $1"
+            return
+        fi
+        sleep 0.1
+    done
+}
+
 # modem_manager_pid: of the ModemManager on the bus.
 modem_manager_pid() {
     gdbus call --system --dest org.freedesktop.DBus --object-path /org/freedesktop/DBus \
