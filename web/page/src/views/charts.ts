@@ -9,7 +9,7 @@ import type { Model } from '../model.js';
 import type { Border } from '../source.js';
 
 /** Beside the plots, so that lanes can stand below them. */
-export const gutter = { left: 72, right: 12 };
+export const gutter = { left: 72, right: 24 };
 const plotHeight = 150;
 
 export interface CurveOf {
@@ -88,10 +88,10 @@ export class Charts {
     private loading = 0;
 
     constructor(private readonly model: Model, private readonly chartsOf: () => ChartOf[]) {
-        model.on('data', () => this.make());
+        model.on('data', () => void this.make());
         model.on('window', () => void this.load());
         model.on('cursor', () => this.setCursor());
-        model.on('look', () => this.make());
+        model.on('look', () => void this.make());
         new ResizeObserver(() => this.resize()).observe(this.element);
     }
 
