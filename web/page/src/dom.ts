@@ -24,8 +24,10 @@ export function svg<K extends keyof SVGElementTagNameMap>(
     return fill(document.createElementNS('http://www.w3.org/2000/svg', name), attributes, children);
 }
 
+/** A sign alone, such as an arrow, is named by the label; any other text names itself. */
 export function button(text: string, label: string, press: () => void): HTMLButtonElement {
-    const made = h('button', { type: 'button', 'aria-label': label, title: label }, text);
+    const isSign = !/[\p{L}\d]/u.test(text);
+    const made = h('button', { type: 'button', 'aria-label': isSign ? label : null, title: label }, text);
     made.addEventListener('click', press);
     return made;
 }
