@@ -48,7 +48,8 @@ using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  ServiceListOptions, SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions,
                  InfoOptions, SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
-                 MaskOptions, VerifyOptions, ReportOptions, ModemListOptions, ModemPolicyOptions, ParseEnd>;
+                 MaskOptions, VerifyOptions, ReportOptions, ModemListOptions, ModemPolicyOptions,
+                 ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

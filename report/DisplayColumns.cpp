@@ -12,9 +12,9 @@ namespace pallax {
 struct DisplayColumns::Node {
     std::string key;
     Column column = {};
-    std::uint32_t text = 0;  ///< that is shown now
-    bool isShown = false;    ///< it, or something below it
-    std::uint32_t seen = 0;  ///< the latest tick that showed it, plus 1
+    std::uint32_t text = 0;                           ///< that is shown now
+    bool isShown = false;                             ///< it, or something below it
+    std::uint32_t seen = 0;                           ///< the latest tick that showed it, plus 1
     std::vector<std::unique_ptr<Node>> children = {}; ///< in the order of the display
 };
 

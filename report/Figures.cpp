@@ -38,9 +38,8 @@ Array textsOf(const std::vector<std::string>& texts) {
 }
 
 std::uint64_t eventsOf(const std::vector<Event>& events, EventKind kind) {
-    return static_cast<std::uint64_t>(
-        std::count_if(events.begin(), events.end(),
-                      [kind](const Event& event) { return event.kind == kind; }));
+    return static_cast<std::uint64_t>(std::count_if(
+        events.begin(), events.end(), [kind](const Event& event) { return event.kind == kind; }));
 }
 
 Array bordersOf(const QualityProfile& profile, std::optional<Measure> measure) {

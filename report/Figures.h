@@ -12,13 +12,13 @@ namespace pallax {
 
 /// What a report says about itself.
 struct ReportHead {
-    std::string title;      ///< empty: that of the recording and its times
-    std::string recording;  ///< without its folder
-    std::string technology; ///< "LTE"
+    std::string title;         ///< empty: that of the recording and its times
+    std::string recording;     ///< without its folder
+    std::string technology;    ///< "LTE"
     std::string version;       ///< of this program
     std::uint64_t packets = 0; ///< of the recording
     bool hasIdentities = false;
-    std::string where = {}; ///< the condition that its ticks meet; empty: all ticks
+    std::string where = {};              ///< the condition that its ticks meet; empty: all ticks
     std::vector<std::string> notes = {}; ///< sentences about what is missing
 };
 

@@ -4,12 +4,11 @@
 #include "text/Base64.h"
 #include "text/Bytes.h"
 
-#include <zlib.h>
-
 #include <bit>
 #include <chrono>
 #include <cmath>
 #include <stdexcept>
+#include <zlib.h>
 
 namespace pallax {
 
@@ -96,8 +95,8 @@ std::string pageData(const Dictionary& figures, const ReportBuilder& report, std
     Words words;
     words.add(static_cast<std::uint32_t>(report.ticks().size()));
     for (std::size_t tick = 0; tick < report.ticks().size(); ++tick) {
-        words.add(millisecondsBetween(report.ticks()[tick > 0 ? tick - 1 : 0],
-                                      report.ticks()[tick]));
+        words.add(
+            millisecondsBetween(report.ticks()[tick > 0 ? tick - 1 : 0], report.ticks()[tick]));
     }
     Array ids;
     const auto addAll = [&](const auto& all) {

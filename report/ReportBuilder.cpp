@@ -49,8 +49,7 @@ std::string cellWords(const StatusCell& cell) {
             words.append(words.empty() ? "" : " ").append(part.name).append(" ").append(part.text);
         }
     }
-    return !words.empty() || cell.identity.empty() ? words
-                                                   : "cell " + cell.identity.front().text;
+    return !words.empty() || cell.identity.empty() ? words : "cell " + cell.identity.front().text;
 }
 
 std::vector<std::string> detailsOf(const StatusCell& cell) {
@@ -220,8 +219,8 @@ void ReportBuilder::addSeries(const Status& status) {
         if (ReportNeighbour* neighbour = neighbourOf(each.system, each.cell)) {
             neighbour->unit = unitOf(each.level);
             neighbour->measure = pallax::measureOf(each.level.field);
-            neighbour->series.add(tick(), isKnown(each.level, status.time) ? each.level.number
-                                                                           : NAN);
+            neighbour->series.add(tick(),
+                                  isKnown(each.level, status.time) ? each.level.number : NAN);
             known.insert(neighbour->id);
         }
     }
@@ -279,8 +278,8 @@ std::set<std::pair<std::string, std::string>>
 ReportBuilder::detectedIn(const CurrentValues& values) const {
     std::set<std::pair<std::string, std::string>> detected;
     for (const CellFields& row : cellFields()) {
-        const auto code = row.role == CellRole::Detected ? values.fields().named(row.code)
-                                                         : std::nullopt;
+        const auto code =
+            row.role == CellRole::Detected ? values.fields().named(row.code) : std::nullopt;
         if (!code) {
             continue;
         }

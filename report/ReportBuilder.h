@@ -48,18 +48,18 @@ struct ReportNeighbour {
     std::string unit = {};
     std::optional<Measure> measure = {};
     HeldSeries series = {};
-    Spread spread = {};      ///< of its level while it was in a list
-    double near = 0;         ///< seconds within 5 dB of the serving cell, or above it
-    double stronger = 0;     ///< seconds above the serving cell
-    double detected = 0;     ///< seconds in which the phone found it without a list
-    bool isServing = false;  ///< at some time
+    Spread spread = {};         ///< of its level while it was in a list
+    double near = 0;            ///< seconds within 5 dB of the serving cell, or above it
+    double stronger = 0;        ///< seconds above the serving cell
+    double detected = 0;        ///< seconds in which the phone found it without a list
+    bool isServing = false;     ///< at some time
     std::uint32_t unlisted = 0; ///< how often it became the serving cell without being in a list
 };
 
 /// A stay in a cell.
 struct ReportStay {
     std::string system;
-    std::string cell; ///< "PCI 184"
+    std::string cell;                 ///< "PCI 184"
     std::vector<std::string> details; ///< "eNodeB 104466 sector 1", "EARFCN 1850", "band 3"
     Time from;
     Time to;

@@ -36,8 +36,8 @@ void addPoint(const pugi::xml_node& node, Track& track) {
     point.latitude = node.attribute("lat").as_double(NAN);
     point.longitude = node.attribute("lon").as_double(NAN);
     for (const pugi::xml_node& child : node.children()) {
-        const auto time = localName(child.name()) == "time" ? timeIn(child.text().get())
-                                                            : std::nullopt;
+        const auto time =
+            localName(child.name()) == "time" ? timeIn(child.text().get()) : std::nullopt;
         const bool isPlace = std::abs(point.latitude) <= kMostLatitude &&
                              std::abs(point.longitude) <= kMostLongitude;
         if (time && isPlace && *time >= kEarliestTime && *time <= kLatestTime) {
@@ -83,9 +83,9 @@ std::string pageTrack(const Track& track) {
     Array points;
     for (std::size_t index = 0; index < track.size(); index += step) {
         const TrackPoint& point = track[index];
-        points.emplace_back(Array{PropertyList::integer(dateOf(point.time).time_since_epoch().count()),
-                                  PropertyList::real(point.latitude),
-                                  PropertyList::real(point.longitude)});
+        points.emplace_back(
+            Array{PropertyList::integer(dateOf(point.time).time_since_epoch().count()),
+                  PropertyList::real(point.latitude), PropertyList::real(point.longitude)});
     }
     std::string json;
     appendJson(json, PropertyList(std::move(points)));

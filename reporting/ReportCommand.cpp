@@ -51,7 +51,8 @@ std::optional<std::string> ReportCommand::make(ExitStatus& status) {
     status = kExitSuccess;
     const std::vector<PartPaths> recordings = joinedParts(_options.recordings, Recording::open);
     if (recordings.size() > kMostRecordings) {
-        _environment.report("report takes one recording, or two to compare");
+        _environment.report(
+            "report takes one recording, or two to compare (see pallax report --help)");
         status = kExitWrongUsage;
         return std::nullopt;
     }
@@ -77,8 +78,8 @@ std::optional<std::string> ReportCommand::trackData(ExitStatus& status) const {
         return "";
     }
     const auto content = readRegularFile(_options.track, kLargestTrack);
-    const auto track = content ? parseTrack(*content)
-                               : Result<Track, std::string>(content.error().reason);
+    const auto track =
+        content ? parseTrack(*content) : Result<Track, std::string>(content.error().reason);
     if (!track) {
         _environment.report(
             formatText("%@ cannot be used as a track: %@.", {_options.track, track.error()}));
@@ -88,8 +89,8 @@ std::optional<std::string> ReportCommand::trackData(ExitStatus& status) const {
     return pageTrack(*track);
 }
 
-std::optional<ReportCommand::Part>
-ReportCommand::makePart(const PartPaths& paths, std::size_t place, ExitStatus& status) {
+std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& paths,
+                                                           std::size_t place, ExitStatus& status) {
     if (const auto missing = missingParts(paths)) {
         _environment.report(*missing);
     }
@@ -142,8 +143,8 @@ bool ReportCommand::gather(Timeline& timeline, const std::string& name, ReportBu
     }
     DecodeWindow window({_options.from, _options.to});
     const Clock& zone = _environment.zone;
-    const auto refusal = window.open(spanOf(timeline),
-                                     [&zone](Time time) { return zone.zone(time).offset; });
+    const auto refusal =
+        window.open(spanOf(timeline), [&zone](Time time) { return zone.zone(time).offset; });
     if (refusal) {
         _environment.report(name + ": " + *refusal);
         status = kExitFailure;
@@ -188,8 +189,8 @@ ReportHead ReportCommand::headOf(const PartPaths& paths, const Timeline& timelin
     return {
         .title = _options.title,
         .recording = shownName(paths),
-        .technology = std::string(
-            gatherReference(technology, _environment.decoder.resources).title),
+        .technology =
+            std::string(gatherReference(technology, _environment.decoder.resources).title),
         .version = _environment.decoder.bundle.version().value_or(""),
         .packets = timeline.packets(),
         .hasIdentities = _options.withIdentities,

@@ -38,13 +38,12 @@ TEST(DisplayColumns, ShowEachTickAsItWas) {
                               {"List", Array{Dictionary{{"PCI", "9"}}, Dictionary{{"PCI", "8"}}}}});
     columns.add(2, Dictionary{{"Cell", Dictionary{{"PCI", "183"}, {"Band", "3"}}},
                               {"List", Array{Dictionary{{"PCI", "8"}}}}});
-    EXPECT_EQ(shownAt(columns, 0),
-              (std::vector<std::string>{"Cell/PCI = 182", "Cell/Band = 3"}));
+    EXPECT_EQ(shownAt(columns, 0), (std::vector<std::string>{"Cell/PCI = 182", "Cell/Band = 3"}));
     EXPECT_EQ(shownAt(columns, 1),
               (std::vector<std::string>{"Cell/PCI = 183", "Cell/TAC = 1", "Cell/Band = 3",
                                         "List/0/PCI = 9", "List/1/PCI = 8"}));
-    EXPECT_EQ(shownAt(columns, 2), (std::vector<std::string>{"Cell/PCI = 183", "Cell/Band = 3",
-                                                             "List/0/PCI = 8"}));
+    EXPECT_EQ(shownAt(columns, 2),
+              (std::vector<std::string>{"Cell/PCI = 183", "Cell/Band = 3", "List/0/PCI = 8"}));
 }
 
 TEST(DisplayColumns, KeepAValueThatDoesNotChangeOnce) {
@@ -59,16 +58,16 @@ TEST(DisplayColumns, KeepAValueThatDoesNotChangeOnce) {
 
 TEST(DisplayColumns, HaveTheRowsThatTheDisplayShows) {
     DisplayColumns columns;
-    columns.add(0, Dictionary{{"Set", Dictionary{{"_sorted", "_sorted"},
-                                                 {"1;48", "b"},
-                                                 {"0;148", "a"},
-                                                 {"2;48", "c"}}},
-                              {"Raw", PropertyList::data({0x01, 0xFF})},
-                              {"Count", PropertyList::integer(6)},
-                              {"Nothing", PropertyList()}});
+    columns.add(
+        0, Dictionary{
+               {"Set",
+                Dictionary{{"_sorted", "_sorted"}, {"1;48", "b"}, {"0;148", "a"}, {"2;48", "c"}}},
+               {"Raw", PropertyList::data({0x01, 0xFF})},
+               {"Count", PropertyList::integer(6)},
+               {"Nothing", PropertyList()}});
     EXPECT_EQ(shownAt(columns, 0),
-              (std::vector<std::string>{"Set/148 = a", "Set/48 = b", "Set/48 = c", "Raw = Af8=",
-                                        "Count = 6"}));
+              (std::vector<std::string>{"Set/148 = a", "Set/48 = b", "Set/48 = c",
+                                        "Raw = Af8=", "Count = 6"}));
 }
 
 TEST(DisplayColumns, AgreeWithAnyDisplays) {
@@ -91,9 +90,8 @@ TEST(DisplayColumns, AgreeWithAnyDisplays) {
                 if (any::between(0, 3) > 0) {
                     display.set(std::string(section), std::move(inner));
                 } else {
-                    std::erase_if(lines, [&](const auto& line) {
-                        return line.first.starts_with(section);
-                    });
+                    std::erase_if(
+                        lines, [&](const auto& line) { return line.first.starts_with(section); });
                 }
             }
             columns.add(tick, display);

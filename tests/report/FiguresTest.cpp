@@ -29,16 +29,16 @@ TEST(Figures, TellWhatTheReportHas) {
             {"Serving Cell Info", Dictionary{{"Physical Cell ID", second < 40 ? "182" : "183"}}},
             {"Serving Cell Measurements",
              Dictionary{{"Measured RSRP", second < 40 ? "-80.00 dBm" : "-120.00 dBm"}}},
-            {"Neighbor Cells List", Array{Dictionary{{"Physical Cell ID", "9"},
-                                                     {"Measured RSRP", "-83.00 dBm"}}}}};
+            {"Neighbor Cells List",
+             Array{Dictionary{{"Physical Cell ID", "9"}, {"Measured RSRP", "-83.00 dBm"}}}}};
         values.values.clear();
         values.read(second, display);
         report.take({ValuesFixture::at(second), values.values, display});
     }
     report.finish();
-    const std::vector<Event> events{{EventKind::PingPong, ValuesFixture::at(39), 7,
-                                     "serving cell 182 → 183", {"lte.x"}},
-                                    {EventKind::Gap, ValuesFixture::at(50), 9, "a gap", {}}};
+    const std::vector<Event> events{
+        {EventKind::PingPong, ValuesFixture::at(39), 7, "serving cell 182 → 183", {"lte.x"}},
+        {EventKind::Gap, ValuesFixture::at(50), 9, "a gap", {}}};
     const Dictionary figures = figuresOf({.title = "<b>",
                                           .recording = "drive.pcap",
                                           .technology = "LTE",
@@ -55,8 +55,7 @@ TEST(Figures, TellWhatTheReportHas) {
         R"({"name":"own","source":"a test","borders":{"rsrp":[{"grade":"good","value":-90},)"
         R"({"grade":"poor","value":-110}]},"graded":[)"))
         << head;
-    EXPECT_TRUE(
-        head.ends_with(R"("stretches":[{"from":1700000000,"to":1700000058,"ticks":30}]})"))
+    EXPECT_TRUE(head.ends_with(R"("stretches":[{"from":1700000000,"to":1700000058,"ticks":30}]})"))
         << head;
     EXPECT_EQ(
         json(figures, "measures"),

@@ -3,13 +3,12 @@
 #include "text/Base64.h"
 #include "text/Bytes.h"
 
-#include <zlib.h>
-
 #include <gtest/gtest.h>
 
 #include <cstdint>
 #include <string>
 #include <string_view>
+#include <zlib.h>
 
 namespace pallax {
 

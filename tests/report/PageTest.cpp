@@ -25,8 +25,8 @@ TEST(Page, AllowsItsOwnScriptAndStyleAlone) {
     const std::string style = between(page, "<style>", "</style>");
     ASSERT_GT(script.size(), 1000U) << "web/page/dist is built";
     EXPECT_EQ(between(page, "Content-Security-Policy\" content=\"", "\""),
-              "default-src 'none'; script-src " + hashOf(script) + "; style-src " +
-                  hashOf(style) + "; img-src data:; base-uri 'none'; form-action 'none'");
+              "default-src 'none'; script-src " + hashOf(script) + "; style-src " + hashOf(style) +
+                  "; img-src data:; base-uri 'none'; form-action 'none'");
 }
 
 TEST(Page, MayAskItsServerWhenItIsLive) {

@@ -11,16 +11,15 @@ namespace {
 class ReportBuilderTest : public testing::Test {
 protected:
     static Dictionary serving(const char* pci, const char* rsrp) {
-        return Dictionary{{"Serving Cell Info", Dictionary{{"Physical Cell ID", pci},
-                                                           {"Download Frequency", "1850"}}},
+        return Dictionary{{"Serving Cell Info",
+                           Dictionary{{"Physical Cell ID", pci}, {"Download Frequency", "1850"}}},
                           {"Serving Cell Measurements", Dictionary{{"Measured RSRP", rsrp}}}};
     }
     static Dictionary with(Dictionary display, const std::string& key, PropertyList value) {
         display.set(key, std::move(value));
         return display;
     }
-    static PropertyList neighbours(
-        const std::vector<std::pair<const char*, const char*>>& cells) {
+    static PropertyList neighbours(const std::vector<std::pair<const char*, const char*>>& cells) {
         Array entries;
         for (const auto& [pci, rsrp] : cells) {
             entries.emplace_back(Dictionary{{"Physical Cell ID", pci}, {"Measured RSRP", rsrp}});
@@ -160,8 +159,7 @@ TEST_F(ReportBuilderTest, ADetectedCellCountsTheTimeWithoutAList) {
 }
 
 TEST_F(ReportBuilderTest, AContextIsThereAsLongAsTheDisplayHasIt) {
-    const PropertyList context(
-        Array{Dictionary{{"APN", "internet"}, {"State", "Active"}}});
+    const PropertyList context(Array{Dictionary{{"APN", "internet"}, {"State", "Active"}}});
     tick(with(serving("182", "-90.00 dBm"), "PDP Context Info", context));
     tick(with(serving("182", "-90.00 dBm"), "PDP Context Info", context));
     tick(serving("182", "-90.00 dBm"));
@@ -176,14 +174,14 @@ TEST_F(ReportBuilderTest, AContextIsThereAsLongAsTheDisplayHasIt) {
 TEST_F(ReportBuilderTest, KeepsABoundedNumberOfNeighboursAndSaysSo) {
     Array entries;
     for (std::size_t pci = 0; pci < ReportBuilder::kMostNeighbours + 1; ++pci) {
-        entries.emplace_back(Dictionary{{"Physical Cell ID", std::to_string(pci)},
-                                        {"Measured RSRP", "-95.00 dBm"}});
+        entries.emplace_back(
+            Dictionary{{"Physical Cell ID", std::to_string(pci)}, {"Measured RSRP", "-95.00 dBm"}});
     }
     tick(with({}, "Neighbor Cells List", PropertyList(std::move(entries))));
     report.finish();
     EXPECT_EQ(report.neighbours().size(), ReportBuilder::kMostNeighbours);
-    EXPECT_EQ(report.notes(), std::vector<std::string>{
-                                  "Only the first 512 neighbouring cells are in the report."});
+    EXPECT_EQ(report.notes(),
+              std::vector<std::string>{"Only the first 512 neighbouring cells are in the report."});
 }
 
 } // namespace

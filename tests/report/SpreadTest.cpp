@@ -67,8 +67,8 @@ TEST(Spread, AgreesWithSortedValues) {
         }
         std::sort(seconds.begin(), seconds.end());
         const double share = any::between(1, 100) / 100.0;
-        const auto place = static_cast<std::size_t>(
-            std::ceil(share * static_cast<double>(seconds.size()) - 1e-9));
+        const auto place =
+            static_cast<std::size_t>(std::ceil(share * static_cast<double>(seconds.size()) - 1e-9));
         RC_ASSERT(spread.quantile(share) == seconds[place - 1] ||
                   spread.quantile(share) == seconds[std::min(place, seconds.size() - 1)]);
     }));

@@ -60,8 +60,8 @@ TEST_F(ReportCommandTest, OfASampleHasItsFigures) {
     for (const json& stay : report["cells"]) {
         cells.push_back(stay["cell"]);
     }
-    EXPECT_EQ(cells, (std::vector<std::string>{"PCI 182", "PCI 183", "PCI 285", "PCI 82",
-                                               "PCI 286", "PCI 184"}));
+    EXPECT_EQ(cells, (std::vector<std::string>{"PCI 182", "PCI 183", "PCI 285", "PCI 82", "PCI 286",
+                                               "PCI 184"}));
 }
 
 TEST_F(ReportCommandTest, LeavesOutWhatIdentifiesAPerson) {
@@ -128,11 +128,12 @@ TEST_F(ReportCommandTest, ComparesTwoRecordingsAndNoMore) {
     EXPECT_EQ(json::parse(pageContent(*page, "figures-0"))["figures"]["head"]["technology"], "LTE");
     EXPECT_EQ(json::parse(pageContent(*page, "figures-1"))["figures"]["head"]["technology"],
               "GSM/UMTS");
-    EXPECT_FALSE(make({sample("lte-drive.pcap"), sample("umts-drive.pcap"),
-                       sample("cdma-drive.pcap")}));
+    EXPECT_FALSE(
+        make({sample("lte-drive.pcap"), sample("umts-drive.pcap"), sample("cdma-drive.pcap")}));
     EXPECT_EQ(status, kExitWrongUsage);
     EXPECT_EQ(reports,
-              std::vector<std::string>{"report takes one recording, or two to compare"});
+              std::vector<std::string>{
+                  "report takes one recording, or two to compare (see pallax report --help)"});
 }
 
 TEST_F(ReportCommandTest, HasAStretchForEachTimeThatTheClockWasSetBack) {
