@@ -261,10 +261,29 @@ TEST(Options, EventsAreOfRecordings) {
     EXPECT_EQ(ended({"events"}).status, kExitWrongUsage);
 }
 
+TEST(Options, AReportIsOfAPartAndHasAProfile) {
+    const auto told = parsed<ReportOptions>(
+        {"report", "a", "b", "-o", "c.html", "--from", "14:02", "--to", "end", "--profile", "field",
+         "--title", "T", "--where", "rsrp < 1", "--track", "w.gpx", "--technology", "gsm"});
+    EXPECT_EQ(told.recordings, (std::vector<std::string>{"a", "b"}));
+    EXPECT_EQ(told.output, "c.html");
+    EXPECT_TRUE(told.from && told.to && told.to->isEnd());
+    EXPECT_EQ(told.profile, "field");
+    EXPECT_EQ(told.title, "T");
+    EXPECT_EQ(told.where, "rsrp < 1");
+    EXPECT_EQ(told.track, "w.gpx");
+    EXPECT_EQ(told.technology->commandName, "gsm");
+    EXPECT_FALSE(told.json);
+    EXPECT_FALSE(told.withIdentities);
+    EXPECT_TRUE(parsed<ReportOptions>({"report", "a", "--json", "--with-identities"}).json);
+    EXPECT_EQ(ended({"report", "a"}).status, kExitWrongUsage);
+}
+
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
-    for (const char* command : {"", "decode", "record", "service", "demo", "simulate", "events",
-                                "fields", "explain", "info", "snapshot", "sql", "status", "diff",
-                                "watch", "mask", "verify", "completion", "manual"}) {
+    for (const char* command :
+         {"",       "decode",  "record", "service",  "demo",       "simulate", "events",
+          "fields", "explain", "info",   "snapshot", "sql",        "status",   "diff",
+          "watch",  "report",  "mask",   "verify",   "completion", "manual"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);

@@ -1,0 +1,118 @@
+#include "tests/cli/EndToEnd.h"
+#include "tests/doubles/Files.h"
+
+#include <nlohmann/json.hpp>
+
+#include <filesystem>
+
+namespace pallax {
+namespace {
+
+namespace fs = std::filesystem;
+
+class EndToEndReport : public EndToEnd {
+protected:
+    std::string sampleDrive() const { return PALLAX_SOURCE_DIR "/samples/lte-drive.pcap"; }
+    std::string page() const { return world.path("drive.html"); }
+};
+
+TEST_F(EndToEndReport, WritesAPageThatItsUserAloneCanRead) {
+    const Run made = run({"report", sampleDrive(), "-o", page()});
+    EXPECT_EQ(made.status, 0);
+    EXPECT_EQ(made.out, "");
+    EXPECT_EQ(made.err, "");
+    const std::string html = doubles::contentOf(page());
+    EXPECT_TRUE(html.starts_with("<!doctype html>"));
+    EXPECT_NE(html.find("id=\"figures-0\""), std::string::npos);
+    EXPECT_NE(html.find("Content-Security-Policy"), std::string::npos);
+    EXPECT_EQ(fs::status(page()).permissions(), fs::perms::owner_read | fs::perms::owner_write);
+    EXPECT_EQ(run({"report", sampleDrive(), "-o", "-"}).out, html) << "the same bytes";
+}
+
+TEST_F(EndToEndReport, PrintsTheFiguresOfEachRecordingOnALine) {
+    const Run made = run({"report", "--json", sampleDrive(), gsmAttach()});
+    EXPECT_EQ(made.status, 0);
+    EXPECT_EQ(made.err, "");
+    const std::size_t end = made.out.find('\n');
+    const auto first = nlohmann::json::parse(made.out.substr(0, end));
+    const auto second = nlohmann::json::parse(made.out.substr(end + 1));
+    EXPECT_EQ(first["head"]["recording"], "lte-drive.pcap");
+    EXPECT_EQ(second["head"]["recording"], "gsm-attach.pcap");
+    EXPECT_EQ(second["head"]["technology"], "GSM/UMTS");
+}
+
+TEST_F(EndToEndReport, ReadsTheNumberedPartsOfARecordingAsOne) {
+    const std::string first =
+        record("drive-0001.pcap", {{std::chrono::seconds(0), registration(1)}});
+    const std::string second =
+        record("drive-0002.pcap", {{std::chrono::seconds(9), registration(0)}});
+    const Run made = run({"report", "--json", first, second});
+    EXPECT_EQ(made.status, 0);
+    const auto figures = nlohmann::json::parse(made.out);
+    EXPECT_EQ(figures["head"]["recording"], "drive.pcap");
+    EXPECT_EQ(figures["head"]["packets"], 2);
+}
+
+TEST_F(EndToEndReport, OfAPipeIsThatOfTheFile) {
+    const Run piped = run({"report", "--json", "-"}, sampleDrive());
+    EXPECT_EQ(piped.status, 0);
+    auto figures = nlohmann::json::parse(piped.out);
+    EXPECT_EQ(figures["head"]["recording"], "standard input");
+    figures["head"]["recording"] = "lte-drive.pcap";
+    EXPECT_EQ(figures, nlohmann::json::parse(run({"report", "--json", sampleDrive()}).out));
+}
+
+TEST_F(EndToEndReport, ACutRecordingGivesAReportThatSaysSo) {
+    const std::string cut = world.path("cut.pcap");
+    fs::copy_file(sampleDrive(), cut);
+    fs::resize_file(cut, 40000);
+    const Run made = run({"report", cut, "-o", page()});
+    EXPECT_EQ(made.status, 1);
+    EXPECT_EQ(made.err, "pallax: " + cut + " ends in the middle of a packet.\n");
+    EXPECT_TRUE(fs::exists(page()));
+}
+
+TEST_F(EndToEndReport, AFatalRecordEndsIt) {
+    const std::string fatal =
+        record("fatal.pcap", {{std::chrono::seconds(0), registration(1)},
+                              {std::chrono::seconds(9), unreadableSimFiles()}});
+    const Run made = run({"report", "--json", "--with-identities", fatal});
+    EXPECT_EQ(made.status, 70);
+    EXPECT_TRUE(made.err.starts_with("pallax: Packet 2 cannot be read: ")) << made.err;
+    EXPECT_EQ(nlohmann::json::parse(made.out)["head"]["packets"], 1);
+}
+
+TEST_F(EndToEndReport, WhatCannotBeWrittenLeavesNothing) {
+    const std::string folder = world.path("missing");
+    const Run made = run({"report", sampleDrive(), "-o", folder + "/drive.html"});
+    EXPECT_EQ(made.status, 1);
+    EXPECT_EQ(made.err,
+              "pallax: " + folder + "/drive.html cannot be written: No such file or directory.\n");
+    const std::string copy = world.path("copy.pcap");
+    fs::copy_file(sampleDrive(), copy);
+    const Run over = run({"report", copy, "-o", copy});
+    EXPECT_EQ(over.status, 1);
+    EXPECT_EQ(over.err, "pallax: " + copy + " would be replaced by its report.\n");
+    EXPECT_EQ(doubles::contentOf(copy), doubles::contentOf(sampleDrive()));
+}
+
+TEST_F(EndToEndReport, WrongUsageIsOneSentence) {
+    const auto refused = [this](const std::vector<std::string>& arguments) {
+        const Run run = this->run(arguments);
+        EXPECT_EQ(run.status, 2) << run.err;
+        return run.err;
+    };
+    EXPECT_EQ(refused({"report", sampleDrive()}),
+              "pallax: --output or --json is required (see pallax report --help)\n");
+    EXPECT_EQ(refused({"report", "-o", page()}),
+              "pallax: RECORDING is required (see pallax report --help)\n");
+    EXPECT_EQ(refused({"report", "--profile", "none", sampleDrive(), "-o", page()}),
+              "pallax: profile \"none\" is not one of android|field|operator "
+              "(see pallax report --help)\n");
+    EXPECT_EQ(refused({"report", sampleDrive(), gsmAttach(), sampleDrive(), "-o", page()}),
+              "pallax: report takes one recording, or two to compare (see pallax report --help)\n");
+    EXPECT_FALSE(fs::exists(page()));
+}
+
+} // namespace
+} // namespace pallax
