@@ -36,6 +36,8 @@ public:
         std::optional<std::chrono::nanoseconds> duration = {};
         /// The service to connect to; null: the machine's own.
         ChildService* child = nullptr;
+        /// Called at the end of the source; if missing, that is the end of receiving, too.
+        std::function<void()> ended = {};
     };
 
     explicit PacketReceiver(Setup setup);
