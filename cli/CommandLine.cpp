@@ -107,6 +107,7 @@ CommandLine::CommandLine()
     addStatus(addCommand("status", "Show the radio in a few lines"), _status);
     addDiff(addCommand("diff", "Compare two recordings, or two moments of one"), _diff);
     addWatch(addCommand("watch", "Tell when a condition becomes true"), _watch);
+    addReport(addCommand("report", "Make a page of a drive"), _report);
     addMask(addCommand("mask", "Copy files without what identifies a person"), _mask);
     addVerify(addCommand("verify", "Tell whether recordings are what they were"), _verify);
     addTexts();
@@ -199,6 +200,9 @@ ParsedOptions CommandLine::chosen() const {
     if (_app->got_subcommand("mask") && _mask.output.empty() && !_mask.check) {
         return wrongUsage("--output or --check is required", "mask");
     }
+    if (_app->got_subcommand("report") && _report.output.empty() && !_report.json) {
+        return wrongUsage("--output or --json is required", "report");
+    }
     if (_mask.output == "-") {
         return wrongUsage("a masked copy is a file, not standard output", "mask");
     }
@@ -249,6 +253,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("status")) {
         return _status;
+    }
+    if (_app->got_subcommand("report")) {
+        return _report;
     }
     if (_app->got_subcommand("verify")) {
         return _verify;

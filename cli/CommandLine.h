@@ -48,6 +48,7 @@ private:
     WatchOptions _watch;
     MaskOptions _mask;
     VerifyOptions _verify;
+    ReportOptions _report;
     SnapshotOptions _snapshot;
     RecordOptions _record;
     ServiceRequest _service;

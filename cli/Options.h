@@ -15,6 +15,7 @@
 #include "querying/SqlCommand.h"
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
+#include "reporting/ReportCommand.h"
 #include "telephony/Service.h"
 #include "verifying/VerifyCommand.h"
 #include "watching/WatchCommand.h"
@@ -47,7 +48,7 @@ using ParsedOptions =
     std::variant<BrowseOptions, DecodeOptions, RecordOptions, ServiceOptions, ServiceStatusOptions,
                  ServiceListOptions, SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions,
                  InfoOptions, SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
-                 MaskOptions, VerifyOptions, ModemListOptions, ModemPolicyOptions, ParseEnd>;
+                 MaskOptions, VerifyOptions, ReportOptions, ModemListOptions, ModemPolicyOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

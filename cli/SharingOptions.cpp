@@ -1,6 +1,8 @@
 #include "cli/SharingOptions.h"
 
+#include "cli/OptionParts.h"
 #include "masking/MaskCommand.h"
+#include "reporting/ReportCommand.h"
 #include "verifying/VerifyCommand.h"
 
 #include <CLI/CLI.hpp>
@@ -50,6 +52,43 @@ Exit status:
   1   failure; with --check, something was found, or a file cannot be read
   2   wrong usage)";
 
+constexpr const char* kReportFooter = R"(Examples:
+  pallax report drive.pcap -o drive.html
+  pallax report before.pcap after.pcap -o compared.html
+  pallax report --from 14:02 --to 14:30 --track walk.gpx drive.pcap -o walk.html
+  pallax report --json drive.pcap | jq '.measures[].quantiles'
+
+The page is one file that any browser opens, without a network: a verdict on
+each level, curves, the cells and states over time, neighbours, events, and the
+whole state at each display tick, which is every two seconds. Two recordings
+are shown beside each other. The numbered parts of one (drive-0001.pcapng,
+drive-0002.pcapng) are read as one.
+
+Levels, cells and states are those that the display shows at its ticks. Each
+stands for the time until the next tick, at most 10 s. Shares of time, the
+values that were not exceeded for 5, 50 and 95 % of it, and the worst minute
+(the least mean) follow from that. A level that was read more than 10 s ago is
+not known any more. Events are those of pallax events.
+
+What identifies a person is left out as by pallax mask, with zeros in its place;
+the page says so, or that --with-identities was given. Identities of cells stay.
+Of a path, only the name of the file is shown.
+
+--where takes a condition as pallax decode does; the report then has only the
+ticks for which it holds. --track draws the way that a GPX file describes,
+without a map. --json prints an object for each recording, with times in
+seconds since 1970.
+
+The same input gives the same bytes. The page can be read by you alone. It
+appears when it is complete.
+
+Exit status:
+  0   success, or the reader of the output has gone
+  1   failure: cannot read a file or template, or write the page; or something
+      is missing in it, as a sentence on standard error tells
+  2   wrong usage, or a wrong condition
+  70  a fatal record ends the report)";
+
 constexpr const char* kVerifyFooter = R"(Examples:
   pallax verify --update drive.pcapng
   pallax verify drive.pcapng
@@ -88,6 +127,29 @@ void addVerify(CLI::App& app, VerifyOptions& options) {
         ->required()
         ->type_name("");
     app.footer(kVerifyFooter);
+}
+
+void addReport(CLI::App& app, ReportOptions& options) {
+    app.add_option("-o,--output", options.output, "The page to write; - is standard output")
+        ->type_name("FILE");
+    app.add_flag("--json", options.json, "Write the figures alone, as JSON");
+    addTechnology(app, "--technology", options.technology,
+                  "The technology of the recordings (default: from their link type)");
+    app.add_option("--profile", options.profile,
+                   "The profile that judges levels (default: android)")
+        ->type_name("android|field|operator|NAME");
+    addTime(app, "--from", options.from, "Begin at this time");
+    addTime(app, "--to", options.to, "End at this time");
+    app.add_option("--where", options.where, "Only the display ticks for which this holds")
+        ->type_name("CONDITION");
+    app.add_option("--title", options.title, "The title of the page")->type_name("TEXT");
+    app.add_option("--track", options.track, "Draw the way in this GPX file")->type_name("FILE");
+    app.add_flag("--with-identities", options.withIdentities,
+                 "Keep what identifies a person, and say so");
+    app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
+        ->required()
+        ->type_name("");
+    app.footer(kReportFooter);
 }
 
 void addMask(CLI::App& app, MaskOptions& options) {

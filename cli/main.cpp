@@ -49,6 +49,7 @@ struct Run {
     ExitStatus operator()(const WatchOptions& options) const { return runWatch(options); }
     ExitStatus operator()(const MaskOptions& options) const { return runMask(options); }
     ExitStatus operator()(const VerifyOptions& options) const { return runVerify(options); }
+    ExitStatus operator()(const ReportOptions& options) const { return runReport(options); }
     ExitStatus operator()(const ModemListOptions& options) const { return runModemList(options); }
     ExitStatus operator()(const ModemPolicyOptions& options) const {
         return runModemPolicy(options);

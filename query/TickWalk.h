@@ -35,6 +35,8 @@ public:
     /// Goes on to the next tick and may keep the current one. False if there is none.
     bool next(const PacketRange& range, bool keepsCurrent);
     const std::deque<State>& kept() const { return _kept; }
+    /// The display at the tick where the walk stands. Valid until the next step.
+    PropertyList display() const { return _replay->displayAt(_now.tick.time); }
 
     /// Whether each tick after packets from `packet` on and from `time` on (in microseconds) is
     /// kept, is the current one, or comes later.

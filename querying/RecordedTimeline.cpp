@@ -128,7 +128,8 @@ RecordedTimeline::index(OpenJournal journal, const Request& request,
         return noTimeOfSnapshot(path == "-" ? "standard input" : path);
     }
     std::unique_ptr<RecordedTimeline> made(new RecordedTimeline);
-    made->_journal = std::move(journal.journal);
+    made->_journal = request.through ? request.through(std::move(journal.journal), *technology)
+                                     : std::move(journal.journal);
     made->_notes = std::move(journal.notes);
     made->_timeline = std::make_unique<Timeline>(
         *made->_journal, DecodingSource{*technology, environment.resources, environment.bundle,

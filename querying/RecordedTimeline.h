@@ -28,6 +28,10 @@ public:
         BoundedJournal::Limits journal = {};
         /// Called now and then with the number of packets that were read.
         std::function<void(std::uint64_t packets)> progress = {};
+        /// Stands between the packets and everything that reads them, such as a mask.
+        std::function<std::unique_ptr<PacketJournal>(std::unique_ptr<PacketJournal> packets,
+                                                     const RecordedTechnology& technology)>
+            through = {};
     };
 
     /// Opens the recordings and reads them once. A file is read again where it is needed; of a

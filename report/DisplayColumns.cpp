@@ -1,0 +1,128 @@
+#include "report/DisplayColumns.h"
+
+#include "text/Base64.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace pallax {
+
+/// A place of the display. A branch has children, a leaf has a column.
+struct DisplayColumns::Node {
+    std::string key;
+    Column column = {};
+    std::uint32_t text = 0;  ///< that is shown now
+    bool isShown = false;    ///< it, or something below it
+    std::uint32_t seen = 0;  ///< the latest tick that showed it, plus 1
+    std::vector<std::unique_ptr<Node>> children = {}; ///< in the order of the display
+};
+
+namespace {
+
+std::string textOf(const PropertyList& leaf) {
+    const SharedBytes data = leaf.data();
+    return data ? base64Text(*data) : leaf.string().value_or(leaf.description());
+}
+
+} // namespace
+
+DisplayColumns::DisplayColumns() : _root(std::make_unique<Node>()), _texts{{}} {}
+
+DisplayColumns::~DisplayColumns() = default;
+
+void DisplayColumns::add(std::uint32_t tick, const PropertyList& display) {
+    _tick = tick;
+    take(*_root, display);
+}
+
+void DisplayColumns::take(Node& node, const PropertyList& value) {
+    node.seen = _tick + 1;
+    node.isShown = true;
+    std::size_t place = 0;
+    if (const DictionaryRef dictionary = value.dictionary()) {
+        for (const Dictionary::Entry& entry : *dictionary) {
+            if (entry.hasStringKey && !entry.value.isNull()) {
+                take(childOf(node, place, entry.key.view()), entry.value);
+                ++place;
+            }
+        }
+    } else if (const ArrayRef array = value.array()) {
+        for (const PropertyList& element : *array) {
+            if (!element.isNull()) {
+                take(childOf(node, place, std::to_string(place)), element);
+                ++place;
+            }
+        }
+    }
+    const bool isLeaf = !value.dictionary() && !value.array() && !value.isNull();
+    change(node, isLeaf ? numberOf(textOf(value)) : 0);
+    for (const auto& child : node.children) {
+        if (child->isShown && child->seen != _tick + 1) {
+            leave(*child);
+        }
+    }
+}
+
+/// The child that should stand there: it seldom moves.
+DisplayColumns::Node& DisplayColumns::childOf(Node& node, std::size_t place, std::string_view key) {
+    auto& children = node.children;
+    if (place < children.size() && children[place]->key == key) {
+        return *children[place];
+    }
+    const auto found = std::find_if(children.begin(), children.end(),
+                                    [key](const auto& child) { return child->key == key; });
+    if (found != children.end()) {
+        return **found;
+    }
+    // A new one stands after the one that was shown before it.
+    auto after = std::find_if(children.rbegin(), children.rend(),
+                              [this](const auto& child) { return child->seen == _tick + 1; });
+    auto child = std::make_unique<Node>(Node{std::string(key)});
+    child->column.path = node.column.path;
+    child->column.path.emplace_back(key);
+    return **children.insert(after.base(), std::move(child));
+}
+
+void DisplayColumns::leave(Node& node) {
+    node.isShown = false;
+    change(node, 0);
+    for (const auto& child : node.children) {
+        if (child->isShown) {
+            leave(*child);
+        }
+    }
+}
+
+void DisplayColumns::change(Node& node, std::uint32_t text) {
+    if (node.text != text && !isFull()) {
+        node.text = text;
+        node.column.changes.push_back({_tick, text});
+        ++_changes;
+    }
+}
+
+std::uint32_t DisplayColumns::numberOf(std::string text) {
+    const auto number = static_cast<std::uint32_t>(_texts.size());
+    const auto [place, isNew] = _numbers.emplace(std::move(text), number);
+    if (isNew) {
+        _texts.push_back(place->first);
+    }
+    return place->second;
+}
+
+void DisplayColumns::gather(const Node& node, std::vector<const Column*>& columns) {
+    if (!node.column.changes.empty()) {
+        columns.push_back(&node.column);
+    }
+    for (const auto& child : node.children) {
+        gather(*child, columns);
+    }
+}
+
+std::vector<const DisplayColumns::Column*> DisplayColumns::columns() const {
+    std::vector<const Column*> columns;
+    gather(*_root, columns);
+    return columns;
+}
+
+} // namespace pallax

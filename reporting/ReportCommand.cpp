@@ -1,0 +1,200 @@
+#include "reporting/ReportCommand.h"
+
+#include "decoding/DecodeWindow.h"
+#include "decoding/DisplayJson.h"
+#include "decoding/StateCondition.h"
+#include "fields/Reference.h"
+#include "host/Files.h"
+#include "masking/MaskedJournal.h"
+#include "platform/Bundle.h"
+#include "platform/Clock.h"
+#include "query/Condition.h"
+#include "querying/RecordedTimeline.h"
+#include "report/Figures.h"
+#include "report/Page.h"
+#include "report/PageData.h"
+#include "report/ReportWalk.h"
+#include "report/Track.h"
+#include "text/Format.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+/// "drive.pcapng": without its folder, whose names are nobody's business.
+std::string shownName(const PartPaths& paths) {
+    if (paths.front() == "-") {
+        return "standard input";
+    }
+    const auto part = partNameOf(paths.front());
+    const bool isSeveral = paths.size() > 1 && part;
+    return std::filesystem::path(isSeveral ? part->whole : paths.front()).filename().string();
+}
+
+TimeSpan spanOf(const Timeline& timeline) {
+    TimeSpan span;
+    for (const Stretch& stretch : timeline.stretches()) {
+        span.stretches.push_back({stretch.first, stretch.latest});
+        span.end = std::max(span.end.value_or(stretch.latest), stretch.latest);
+    }
+    span.begin = span.stretches.front().begin;
+    return span;
+}
+
+} // namespace
+
+std::optional<std::string> ReportCommand::make(ExitStatus& status) {
+    status = kExitSuccess;
+    const std::vector<PartPaths> recordings = joinedParts(_options.recordings, Recording::open);
+    if (recordings.size() > kMostRecordings) {
+        _environment.report("report takes one recording, or two to compare");
+        status = kExitWrongUsage;
+        return std::nullopt;
+    }
+    const auto track = trackData(status);
+    if (!track) {
+        return std::nullopt;
+    }
+    std::string page = *track;
+    std::string json;
+    for (std::size_t place = 0; place < recordings.size(); ++place) {
+        const auto part = makePart(recordings[place], place, status);
+        if (!part) {
+            return std::nullopt;
+        }
+        page += part->page;
+        json += part->json;
+    }
+    return _options.json ? json : pageHtml(page, PageUse::Report);
+}
+
+std::optional<std::string> ReportCommand::trackData(ExitStatus& status) const {
+    if (_options.track.empty()) {
+        return "";
+    }
+    const auto content = readRegularFile(_options.track, kLargestTrack);
+    const auto track = content ? parseTrack(*content)
+                               : Result<Track, std::string>(content.error().reason);
+    if (!track) {
+        _environment.report(
+            formatText("%@ cannot be used as a track: %@.", {_options.track, track.error()}));
+        status = kExitFailure;
+        return std::nullopt;
+    }
+    return pageTrack(*track);
+}
+
+std::optional<ReportCommand::Part>
+ReportCommand::makePart(const PartPaths& paths, std::size_t place, ExitStatus& status) {
+    if (const auto missing = missingParts(paths)) {
+        _environment.report(*missing);
+    }
+    RecordedTimeline::Request request{paths, _options.technology, _environment.journal,
+                                      _environment.progress};
+    if (!_options.withIdentities) {
+        request.through = [this](std::unique_ptr<PacketJournal> packets,
+                                 const RecordedTechnology& technology) {
+            return std::make_unique<MaskedJournal>(std::move(packets), technology,
+                                                   _environment.decoder.resources);
+        };
+    }
+    const auto recorded = RecordedTimeline::open(request, _environment.decoder);
+    if (!recorded) {
+        _environment.report(recorded.error().sentence);
+        status = kExitFailure;
+        return std::nullopt;
+    }
+    Timeline& timeline = (*recorded)->timeline();
+    const std::string name = shownName(paths);
+    ReportBuilder report(_environment.names, _environment.profile);
+    std::vector<Event> events;
+    if (!gather(timeline, name, report, events, status)) {
+        return std::nullopt;
+    }
+    ReportHead head = headOf(paths, timeline);
+    head.notes = (*recorded)->notes();
+    for (const std::string& note : head.notes) {
+        _environment.report(note);
+        status = kExitFailure;
+    }
+    status = timeline.hasEnded() ? kExitFatalRecord : status;
+    const Dictionary figures = figuresOf(head, report, events, timeline.fields());
+    Part part;
+    if (_options.json) {
+        appendJson(part.json, figures);
+        part.json += '\n';
+    } else {
+        part.page = pageData(figures, report, place);
+    }
+    return part;
+}
+
+bool ReportCommand::gather(Timeline& timeline, const std::string& name, ReportBuilder& report,
+                           std::vector<Event>& events, ExitStatus& status) {
+    if (timeline.packets() == 0) {
+        _environment.report(formatText("%@ holds no packets.", {name}));
+        status = kExitFailure;
+        return false;
+    }
+    DecodeWindow window({_options.from, _options.to});
+    const Clock& zone = _environment.zone;
+    const auto refusal = window.open(spanOf(timeline),
+                                     [&zone](Time time) { return zone.zone(time).offset; });
+    if (refusal) {
+        _environment.report(name + ": " + *refusal);
+        status = kExitFailure;
+        return false;
+    }
+    std::unique_ptr<QueryCondition> condition;
+    if (_options.where) {
+        auto compiled =
+            QueryCondition::compile(*_options.where, timeline.fields(),
+                                    QueryCondition::About::State, _environment.decoder.knowledge);
+        if (!compiled) {
+            _environment.report("--where: " + compiled.error());
+            status = kExitWrongUsage;
+            return false;
+        }
+        condition = std::move(compiled).value();
+    }
+    gatherTicks(timeline, report, [&](const TickWalk::State& state) {
+        if (!window.contains(state.tick.time) || condition == nullptr) {
+            return window.contains(state.tick.time);
+        }
+        const auto holds = condition->holds(
+            {{state.tick.time, state.packet, state.tick.number}, nullptr}, state.values);
+        if (!holds) {
+            throw ConditionFailure(holds.error());
+        }
+        return *holds;
+    });
+    report.finish();
+    std::copy_if(timeline.events().begin(), timeline.events().end(), std::back_inserter(events),
+                 [&window](const Event& event) { return window.contains(event.time); });
+    if (report.ticks().empty()) {
+        _environment.report(formatText("%@ shows nothing in that time.", {name}));
+        status = kExitFailure;
+        return false;
+    }
+    return true;
+}
+
+ReportHead ReportCommand::headOf(const PartPaths& paths, const Timeline& timeline) const {
+    const RecordedTechnology& technology = *technologyOfCommandName(timeline.fields().technology());
+    return {
+        .title = _options.title,
+        .recording = shownName(paths),
+        .technology = std::string(
+            gatherReference(technology, _environment.decoder.resources).title),
+        .version = _environment.decoder.bundle.version().value_or(""),
+        .packets = timeline.packets(),
+        .hasIdentities = _options.withIdentities,
+        .where = _options.where.value_or(""),
+    };
+}
+
+} // namespace pallax

@@ -1,0 +1,84 @@
+#pragma once
+
+#include "console/ExitStatus.h"
+#include "decoding/RecordingDecoder.h"
+#include "host/BoundedJournal.h"
+#include "host/RecordingParts.h"
+#include "knowledge/Networks.h"
+#include "knowledge/Quality.h"
+#include "plist/PropertyList.h"
+#include "text/TimeText.h"
+
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace pallax {
+
+class Clock;
+class Output;
+class ReportBuilder;
+class Timeline;
+struct RecordedTechnology;
+struct ReportHead;
+
+/// `pallax report`: a recording as a page, or two of them to compare.
+struct ReportOptions {
+    std::vector<std::string> recordings = {};
+    std::string output = {}; ///< the page; "-" is standard output
+    bool json = false;       ///< the figures alone, to `output` or else standard output
+    const RecordedTechnology* technology = nullptr; ///< overrides the link type
+    std::string profile{kDefaultProfile};
+    std::optional<TimeText> from = {};
+    std::optional<TimeText> to = {};
+    std::optional<std::string> where = {}; ///< only the ticks for which it holds
+    std::string title = {};
+    bool withIdentities = false;
+    std::string track = {}; ///< a GPX file
+};
+
+class ReportCommand {
+public:
+    /// The most recordings that a page compares.
+    static constexpr std::size_t kMostRecordings = 2;
+
+    struct Environment {
+        const DecoderEnvironment& decoder;
+        const NetworkNames& names;
+        const QualityProfile& profile;
+        const Clock& zone; ///< for times of the command line
+        std::function<void(const std::string& sentence)> report;
+        std::function<void(std::uint64_t packets)> progress = {};
+        BoundedJournal::Limits journal = {}; ///< for recordings that are kept
+    };
+
+    ReportCommand(const ReportOptions& options, const Environment& environment)
+        : _options(options), _environment(environment) {}
+
+    /// What to write to the output; nothing if there is none. `status` is then why, and otherwise
+    /// tells whether something is missing.
+    std::optional<std::string> make(ExitStatus& status);
+
+private:
+    struct Part {
+        std::string page;
+        std::string json;
+    };
+
+    std::optional<Part> makePart(const PartPaths& paths, std::size_t place, ExitStatus& status);
+    /// False after a complaint about the options.
+    bool gather(Timeline& timeline, const std::string& name, ReportBuilder& report,
+                std::vector<struct Event>& events, ExitStatus& status);
+    ReportHead headOf(const PartPaths& paths, const Timeline& timeline) const;
+    std::optional<std::string> trackData(ExitStatus& status) const;
+
+    const ReportOptions& _options;
+    const Environment& _environment;
+};
+
+/// `ReportCommand`, wired to this machine. TemplateFailure, OutputClosed and OutputFailure leave.
+ExitStatus runReport(const ReportOptions& options);
+
+} // namespace pallax

@@ -1,0 +1,122 @@
+#include "LogGenerator/Technologies/Technologies.h"
+#include "console/Output.h"
+#include "console/Progress.h"
+#include "console/TerminalLine.h"
+#include "decoding/DroppedNotices.h"
+#include "decoding/InstalledKnowledge.h"
+#include "decoding/Preconditions.h"
+#include "decoding/RequiredTemplates.h"
+#include "decoding/StateCondition.h"
+#include "host/BuildBundle.h"
+#include "host/Complaint.h"
+#include "host/DirectoryResources.h"
+#include "host/FileIdentity.h"
+#include "host/KnowledgeFiles.h"
+#include "host/NewFile.h"
+#include "host/UserFolders.h"
+#include "host/WallClock.h"
+#include "link/Settings.h"
+#include "reporting/ReportCommand.h"
+#include "text/Format.h"
+
+#include <cerrno>
+#include <cstring>
+#include <unistd.h>
+
+namespace pallax {
+
+namespace {
+
+bool isStandardOutput(const ReportOptions& options) {
+    return options.output == "-" || (options.output.empty() && options.json);
+}
+
+/// Whole, or not at all.
+ExitStatus write(const ReportOptions& options, const std::string& content) {
+    if (isStandardOutput(options)) {
+        Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
+        output.text() += content;
+        output.flush();
+        return kExitSuccess;
+    }
+    const auto file = NewFile::create(options.output);
+    const Bytes bytes{reinterpret_cast<const std::uint8_t*>(content.data()), content.size()};
+    if (file && file->write(bytes) && file->finish()) {
+        return kExitSuccess;
+    }
+    complain(formatText("%@ cannot be written: %@.", {options.output, std::strerror(errno)}));
+    return kExitFailure;
+}
+
+std::optional<std::string> refusalOf(const ReportOptions& options) {
+    if (isStandardOutput(options)) {
+        return outputIntoRecording(options.recordings);
+    }
+    std::error_code ignored;
+    if (recordingAmong(options.recordings, regularFile(options.output))) {
+        return formatText("%@ would be replaced by its report.", {options.output});
+    }
+    return std::nullopt;
+}
+
+ExitStatus make(const ReportOptions& options, const Settings& settings,
+                const QualityProfile& profile) {
+    const InstalledNames installed = readInstalledNames(dataFolders());
+    for (const std::string& complaint : installed.complaints) {
+        complain(complaint);
+    }
+    const RequiredTemplates resources(DirectoryResources::programFolder());
+    const BuildBundle bundle;
+    DroppedNotices notices;
+    const WallClock clock;
+    TerminalLine line = TerminalLine::onStandardError();
+    ProgressPace pace(clock);
+    const DecoderEnvironment decoder{resources, bundle, notices, technologies(),
+                                     installedKnowledge()};
+    const ReportCommand::Environment environment{
+        decoder,
+        installed.names,
+        profile,
+        clock,
+        [&line](const std::string& sentence) {
+            line.wipe();
+            complain(sentence);
+        },
+        [&](std::uint64_t packets) {
+            if (line.isPossible() && pace.isDue()) {
+                line.show("reading: " + packetCount(packets));
+            }
+        },
+        settings.journal};
+    ExitStatus status = kExitSuccess;
+    const auto content = ReportCommand(options, environment).make(status);
+    line.wipe();
+    if (!content) {
+        return status;
+    }
+    const ExitStatus written = write(options, *content);
+    return written == kExitSuccess ? status : written;
+}
+
+} // namespace
+
+ExitStatus runReport(const ReportOptions& options) {
+    if (const auto refusal = refusalOf(options)) {
+        complain(*refusal);
+        return kExitFailure;
+    }
+    const SettingsResult settings = loadSettings(settingsFiles());
+    if (!settings) {
+        complain(settings.error().sentence);
+        return kExitFailure;
+    }
+    const auto profile = loadProfile(options.profile, profileFolder());
+    if (!profile) {
+        complain(profile.error().sentence +
+                 (profile.error().isUnknown ? " (see pallax report --help)" : ""));
+        return profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+    }
+    return make(options, *settings, *profile);
+}
+
+} // namespace pallax
