@@ -60,7 +60,7 @@ void PacketReceiver::start() {
     if (_link.hasChild()) {
         _looks = queue.scheduleRepeating(BrowseLink::kLookInterval, [this] {
             if (_link.childHasEnded()) {
-                fail("The service of the recorder has ended.");
+                fail(_setup.lostChild);
             }
         });
     }

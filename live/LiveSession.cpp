@@ -41,7 +41,8 @@ std::optional<std::string> LiveSession::receive(SocketDirectory directory) {
     PacketReceiver receiver({std::move(directory), "Timeline", _setup.wanted,
                              [this](const RecordedTechnology& technology, Time stamp,
                                     Bytes packet) { add(technology, stamp, packet); },
-                             _setup.waits, _setup.duration, _setup.child, _setup.ended});
+                             _setup.waits, _setup.duration, _setup.child, _setup.lostChild,
+                             _setup.ended});
     const auto indexed = [this, &receiver](Timeline& timeline) {
         _setup.indexed(timeline);
         if (timeline.hasEnded() && !_setup.ended) {
@@ -57,7 +58,7 @@ std::optional<std::string> LiveSession::receive(SocketDirectory directory) {
                                                            .report = complain,
                                                            .indexed = indexed,
                                                            .replaced = _setup.replaced});
-    _setup.began(receiver.queue());
+    const auto served = _setup.began ? _setup.began(receiver.queue()) : nullptr;
     auto failure = receiver.run();
     _timeline->finish();
     return failure;

@@ -33,10 +33,12 @@ public:
         std::function<void(Timeline& timeline)> indexed = [](Timeline&) {}; ///< as for LiveTimeline
         std::string service = {};      ///< its name; empty: the one without a name
         ChildService* child = nullptr; ///< as for PacketReceiver
+        std::string lostChild = {};    ///< likewise
         /// What is kept and decoded in place of a packet; if missing, the packet itself.
         std::function<ByteBuffer(const RecordedTechnology& technology, Bytes packet)> masked = {};
-        /// Called before anything is received, with the queue that runs until the end.
-        std::function<void(AsioMainQueue& queue)> began = [](AsioMainQueue&) {};
+        /// Called before anything is received, with the queue that runs until the end. What it
+        /// returns is destroyed before the queue.
+        std::function<std::shared_ptr<void>(AsioMainQueue& queue)> began = {};
         std::function<void()> replaced = [] {}; ///< as for LiveTimeline
         /// Called at the end of the source. If present, neither that nor a fatal record ends the
         /// session.

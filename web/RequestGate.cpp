@@ -78,7 +78,19 @@ RequestGate::Verdict RequestGate::refusal(const WebRequest& request) const {
     return {Decision::Serve};
 }
 
-RequestGate::Verdict RequestGate::decide(const WebRequest& request) const {
+bool RequestGate::opens(const WebRequest& request) {
+    const std::string* token = request.argument("token");
+    if (request.path != "/" || token == nullptr) {
+        return false;
+    }
+    if (_setup.once && _setup.once->is(*token)) {
+        _setup.once.reset();
+        return true;
+    }
+    return _setup.link.is(*token);
+}
+
+RequestGate::Verdict RequestGate::decide(const WebRequest& request) {
     Verdict verdict = refusal(request);
     if (verdict.decision == Decision::Refuse) {
         return verdict;
@@ -88,8 +100,7 @@ RequestGate::Verdict RequestGate::decide(const WebRequest& request) const {
                    ? verdict
                    : refused(403, "Only programs of that machine get its metrics.");
     }
-    const std::string* token = request.argument("token");
-    if (request.path == "/" && token != nullptr && _setup.link.is(*token)) {
+    if (opens(request)) {
         return {Decision::Enter, entrance()};
     }
     const auto cookie = request.cookie(_cookie);
@@ -110,14 +121,13 @@ WebResponse RequestGate::entrance() const {
     return response;
 }
 
-std::string RequestGate::link() const {
+std::string RequestGate::linkWith(const AccessToken& token) const {
     const bool isAnywhere = _setup.address == "0.0.0.0" || _setup.address == "::";
     const bool isV6 = _setup.address.find(':') != std::string::npos;
     const std::string host = isAnywhere ? "localhost"
                              : isV6     ? "[" + _setup.address + "]"
                                         : _setup.address;
-    return formatText("%@%@:%u/?token=%@",
-                      {_scheme, host, unsigned{_setup.port}, _setup.link.text()});
+    return formatText("%@%@:%u/?token=%@", {_scheme, host, unsigned{_setup.port}, token.text()});
 }
 
 } // namespace pallax

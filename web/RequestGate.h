@@ -4,6 +4,7 @@
 #include "web/Request.h"
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -17,7 +18,9 @@ public:
         std::string address;    ///< that is listened on, without brackets
         std::uint16_t port = 0; ///< likewise
         bool isEncrypted = false;
-        AccessToken link;    ///< in the link that the user gets
+        AccessToken link; ///< in the link that the user gets
+        /// Another one that lets in once, for a link that other users of the machine may see.
+        std::optional<AccessToken> once = std::nullopt;
         AccessToken session; ///< in the cookie that a client gets for it
         bool hasMetrics = false;
     };
@@ -36,12 +39,16 @@ public:
 
     explicit RequestGate(Setup setup);
 
-    Verdict decide(const WebRequest& request) const;
+    Verdict decide(const WebRequest& request);
     /// What the user opens in a browser.
-    std::string link() const;
+    std::string link() const { return linkWith(_setup.link); }
+    /// The same with the token that lets in once, which must be there.
+    std::string linkForOnce() const { return linkWith(*_setup.once); }
 
 private:
     bool isOurs(std::string_view host) const;
+    bool opens(const WebRequest& request);
+    std::string linkWith(const AccessToken& token) const;
     Verdict refusal(const WebRequest& request) const;
     WebResponse entrance() const;
 

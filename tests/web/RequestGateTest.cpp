@@ -15,8 +15,8 @@ class RequestGateTest : public testing::Test {
 protected:
     static RequestGate gate(const std::string& address = "127.0.0.1", std::uint16_t port = 8080,
                             bool isEncrypted = false, bool hasMetrics = false) {
-        return RequestGate(
-            {address, port, isEncrypted, AccessToken(kLink), AccessToken(kSession), hasMetrics});
+        return RequestGate({address, port, isEncrypted, AccessToken(kLink), std::nullopt,
+                            AccessToken(kSession), hasMetrics});
     }
     static WebRequest request(const std::string& path = "/api/figures") {
         return {.method = "GET",
@@ -25,7 +25,7 @@ protected:
                 .isFromThisMachine = true};
     }
     /// 0 if it is served.
-    static unsigned statusOf(const RequestGate& gate, const WebRequest& request) {
+    static unsigned statusOf(RequestGate gate, const WebRequest& request) {
         const RequestGate::Verdict verdict = gate.decide(request);
         return verdict.decision == Decision::Serve ? 0U : verdict.response.status;
     }
@@ -152,6 +152,27 @@ TEST_F(RequestGateTest, TheLinkGivesTheCookieAndLeavesTheAddressBar) {
         first.query[0].second = wrong;
         EXPECT_EQ(statusOf(gate(), first), 403U) << wrong;
     }
+}
+
+TEST_F(RequestGateTest, ALinkForOnceOpensOnce) {
+    RequestGate once({.address = "127.0.0.1",
+                      .port = 8080,
+                      .link = AccessToken(kLink),
+                      .once = AccessToken(std::string(32, '5')),
+                      .session = AccessToken(kSession)});
+    EXPECT_EQ(once.linkForOnce(), "http://127.0.0.1:8080/?token=" + std::string(32, '5'));
+    const auto status = [&once](const std::string& token) {
+        return once
+            .decide({.method = "GET",
+                     .path = "/",
+                     .headers = {{"Host", "127.0.0.1:8080"}},
+                     .query = {{"token", token}}})
+            .response.status;
+    };
+    EXPECT_EQ(status(std::string(32, '5')), 303U);
+    EXPECT_EQ(status(std::string(32, '5')), 403U);
+    EXPECT_EQ(status(kLink), 303U);
+    EXPECT_EQ(status(kLink), 303U);
 }
 
 TEST_F(RequestGateTest, ARequestHasNoContent) {
