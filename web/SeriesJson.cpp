@@ -61,7 +61,8 @@ std::vector<float> valuesAt(const HeldSeries& series, const std::vector<std::uin
     return values;
 }
 
-/// Of each run, the least and the greatest value, in the order in which they come.
+/// Of each run, the least and the greatest value, in the order in which they come; of one tick, its
+/// value.
 std::vector<float> extremesOf(const std::vector<float>& values, std::size_t run) {
     std::vector<float> kept;
     for (std::size_t first = 0; first < values.size(); first += run) {
@@ -77,7 +78,9 @@ std::vector<float> extremesOf(const std::vector<float>& values, std::size_t run)
         }
         const auto [one, other] = std::minmax(least, greatest);
         kept.push_back(one == end ? std::nanf("") : *one);
-        kept.push_back(other == end ? std::nanf("") : *other);
+        if (end - begin > 1) {
+            kept.push_back(other == end ? std::nanf("") : *other);
+        }
     }
     return kept;
 }
@@ -88,7 +91,9 @@ std::vector<std::uint32_t> placesOf(const std::vector<std::uint32_t>& ticks, std
     for (std::size_t first = 0; first < ticks.size(); first += run) {
         const std::size_t count = std::min(run, ticks.size() - first);
         kept.push_back(ticks[first]);
-        kept.push_back(ticks[first + count / 2]);
+        if (count > 1) {
+            kept.push_back(ticks[first + count / 2]);
+        }
     }
     return kept;
 }
@@ -99,14 +104,9 @@ std::string seriesJson(const std::vector<Time>& ticks, std::span<const HeldSerie
                        const SeriesRange& range) {
     const std::vector<std::uint32_t> all = ascendingTicks(ticks, range);
     const std::size_t most = std::max<std::size_t>(range.points, 2);
-    // Of a run of fewer than two ticks, there are no two places.
-    const std::size_t run =
-        all.size() <= most ? 1 : std::max<std::size_t>(2, 2 * all.size() / most);
-    const std::size_t whole = run == 1 ? all.size() : all.size() - (all.size() % run == 1 ? 1 : 0);
-    const std::vector<std::uint32_t> shown(all.begin(),
-                                           all.begin() + static_cast<std::ptrdiff_t>(whole));
+    const std::size_t run = all.size() <= most ? 1 : (2 * all.size() + most - 1) / most;
     std::vector<double> times;
-    for (const std::uint32_t tick : run == 1 ? shown : placesOf(shown, run)) {
+    for (const std::uint32_t tick : placesOf(all, run)) {
         times.push_back(pageSeconds(ticks[tick]));
     }
     std::string out = "{\"times\":";
@@ -114,8 +114,8 @@ std::string seriesJson(const std::vector<Time>& ticks, std::span<const HeldSerie
     out += ",\"values\":[";
     for (std::size_t index = 0; index < series.size(); ++index) {
         out += index == 0 ? "" : ",";
-        const std::vector<float> values = valuesAt(*series[index], shown);
-        appendNumbers(out, run == 1 ? values : extremesOf(values, run));
+        const std::vector<float> values = valuesAt(*series[index], all);
+        appendNumbers(out, extremesOf(values, run));
     }
     return out + "]}";
 }
