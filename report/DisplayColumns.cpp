@@ -1,5 +1,6 @@
 #include "report/DisplayColumns.h"
 
+#include "app/tree/ShownEntries.h"
 #include "text/Base64.h"
 
 #include <algorithm>
@@ -40,11 +41,9 @@ void DisplayColumns::take(Node& node, const PropertyList& value) {
     node.isShown = true;
     std::size_t place = 0;
     if (const DictionaryRef dictionary = value.dictionary()) {
-        for (const Dictionary::Entry& entry : *dictionary) {
-            if (entry.hasStringKey && !entry.value.isNull()) {
-                take(childOf(node, place, entry.key.view()), entry.value);
-                ++place;
-            }
+        for (const ShownEntry& entry : shownEntries(*dictionary)) {
+            take(childOf(node, place, entry.name), *entry.value);
+            ++place;
         }
     } else if (const ArrayRef array = value.array()) {
         for (const PropertyList& element : *array) {
@@ -66,11 +65,13 @@ void DisplayColumns::take(Node& node, const PropertyList& value) {
 /// The child that should stand there: it seldom moves.
 DisplayColumns::Node& DisplayColumns::childOf(Node& node, std::size_t place, std::string_view key) {
     auto& children = node.children;
-    if (place < children.size() && children[place]->key == key) {
+    const auto isFree = [&](const auto& child) { // several rows can have the same name
+        return child->key == key && child->seen != _tick + 1;
+    };
+    if (place < children.size() && isFree(children[place])) {
         return *children[place];
     }
-    const auto found = std::find_if(children.begin(), children.end(),
-                                    [key](const auto& child) { return child->key == key; });
+    const auto found = std::find_if(children.begin(), children.end(), isFree);
     if (found != children.end()) {
         return **found;
     }

@@ -23,7 +23,7 @@ public:
         std::uint32_t text; ///< its place in `texts`; 0: nothing is shown from here on
     };
     struct Column {
-        std::vector<std::string> path; ///< keys; an entry of an array has its position
+        std::vector<std::string> path; ///< names of rows; an entry of an array has its position
         std::vector<Change> changes;
     };
 

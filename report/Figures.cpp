@@ -15,7 +15,12 @@ namespace {
 
 constexpr double kThousand = 1000;
 
+/// Whole numbers without an exponent: the shortest text of a real can have one.
 PropertyList number(double value) {
+    constexpr double kExact = 9007199254740992.0;
+    if (std::abs(value) < kExact && value == std::trunc(value)) {
+        return PropertyList::integer(static_cast<std::int64_t>(value));
+    }
     return std::isfinite(value) ? PropertyList::real(value) : PropertyList();
 }
 

@@ -67,11 +67,13 @@ std::vector<std::string> detailsOf(const StatusCell& cell) {
 }
 
 /// The serving cell under the names that lists of neighbours give their cells.
-std::set<std::string> namesInLists(const StatusCell& cell) {
+std::set<std::string> namesInLists(const StatusCell& cell, std::string_view technology) {
     std::set<std::string> names;
     for (const StatusCellFields& rule : statusCells()) {
-        for (const StatusList& list : rule.name == cell.system ? rule.lists
-                                                               : std::span<const StatusList>()) {
+        if (rule.technology != technology || rule.name != cell.system) {
+            continue;
+        }
+        for (const StatusList& list : rule.lists) {
             std::string words;
             for (const StatusField& field : list.identity) {
                 const StatusValue* part = partOf(cell, field.name);
@@ -120,7 +122,7 @@ void ReportBuilder::take(const ReportTick& tick) {
         _network = status.network;
     }
     addSeries(status);
-    addStays(status, tick.time, tick.isAfterStep);
+    addStays(status, tick);
     if (tick.isAfterStep) {
         for (ReportMeasure& measure : _measures) {
             measure.worst.restart();
@@ -235,8 +237,8 @@ void ReportBuilder::addSeries(const Status& status) {
     }
 }
 
-void ReportBuilder::addStays(const Status& status, Time time, bool isAfterStep) {
-    if (isAfterStep) {
+void ReportBuilder::addStays(const Status& status, const ReportTick& tick) {
+    if (tick.isAfterStep) {
         _current.clear();
     }
     for (const StatusCell& cell : status.cells) {
@@ -249,17 +251,17 @@ void ReportBuilder::addStays(const Status& status, Time time, bool isAfterStep) 
             }
             continue;
         }
-        noteServing(cell, current != _current.end());
+        noteServing(cell, tick.values.fields().technology(), current != _current.end());
         if (_stays.size() < kMostStays) {
             _current[cell.system] = _stays.size();
-            _stays.push_back({cell.system, words, detailsOf(cell), time, time});
+            _stays.push_back({cell.system, words, detailsOf(cell), tick.time, tick.time});
         }
     }
 }
 
 /// `isNew`: the phone came from another cell.
-void ReportBuilder::noteServing(const StatusCell& cell, bool isNew) {
-    for (const std::string& name : namesInLists(cell)) {
+void ReportBuilder::noteServing(const StatusCell& cell, std::string_view technology, bool isNew) {
+    for (const std::string& name : namesInLists(cell, technology)) {
         const bool wasListed =
             _pending && std::any_of(_pending->status.neighbours.begin(),
                                     _pending->status.neighbours.end(), [&](const auto& each) {

@@ -111,8 +111,8 @@ private:
     void settleNeighbours(double seconds);
     void settleLanes(Time until);
     void addSeries(const Status& status);
-    void addStays(const Status& status, Time time, bool isAfterStep);
-    void noteServing(const StatusCell& cell, bool isNew);
+    void addStays(const Status& status, const ReportTick& tick);
+    void noteServing(const StatusCell& cell, std::string_view technology, bool isNew);
     std::set<std::pair<std::string, std::string>> detectedIn(const CurrentValues& values) const;
     ReportMeasure& measureOf(const StatusCell& cell, const StatusValue& level);
     ReportNeighbour* neighbourOf(const std::string& system, const std::string& cell);

@@ -1,7 +1,6 @@
 #include "report/Track.h"
 
 #include "decoding/DisplayJson.h"
-#include "report/Figures.h"
 #include "report/PageData.h"
 
 #include <pugixml.hpp>
@@ -84,7 +83,7 @@ std::string pageTrack(const Track& track) {
     Array points;
     for (std::size_t index = 0; index < track.size(); index += step) {
         const TrackPoint& point = track[index];
-        points.emplace_back(Array{PropertyList::real(pageSeconds(point.time)),
+        points.emplace_back(Array{PropertyList::integer(dateOf(point.time).time_since_epoch().count()),
                                   PropertyList::real(point.latitude),
                                   PropertyList::real(point.longitude)});
     }

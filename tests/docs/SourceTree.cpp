@@ -15,7 +15,7 @@ std::vector<std::string> sourceFiles(const std::vector<std::string>& extensions)
     for (auto entry = fs::recursive_directory_iterator(root);
          entry != fs::recursive_directory_iterator(); ++entry) {
         const std::string name = entry->path().filename().string();
-        const bool isBuilt = entry.depth() == 0 && name == "build";
+        const bool isBuilt = (entry.depth() == 0 && name == "build") || name == "node_modules";
         if (entry->is_directory() && (isBuilt || name.starts_with("."))) {
             entry.disable_recursion_pending();
         } else if (std::find(extensions.begin(), extensions.end(), entry->path().extension()) !=

@@ -6,7 +6,7 @@
 namespace pallax::doubles {
 
 /// The files of the source tree with one of these extensions (".h"), as sorted paths from its root,
-/// without build folders and hidden files.
+/// without build folders, hidden files, and the packages of the page.
 std::vector<std::string> sourceFiles(const std::vector<std::string>& extensions);
 
 /// The text of a file of the source tree.

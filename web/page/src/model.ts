@@ -1,0 +1,95 @@
+// What all views share: the data, the shown part of the time, and the instant that is looked at.
+import { CellColours } from './colours.js';
+import type { Figures, Seconds, Source } from './source.js';
+
+export type Part = 'data' | 'window' | 'cursor' | 'look';
+type Listener = () => void;
+
+const leastWindow = 4;
+
+export class Model {
+    from: Seconds;
+    to: Seconds;
+    cursor: Seconds;
+    colours: CellColours;
+    private readonly listeners: [Part, Listener][] = [];
+
+    constructor(
+        readonly source: Source,
+        public figures: Figures,
+    ) {
+        [this.from, this.to] = this.whole();
+        this.cursor = this.to;
+        this.colours = new CellColours(figures.cells.map((stay) => stay.cell));
+    }
+
+    on(part: Part, listener: Listener): void {
+        this.listeners.push([part, listener]);
+    }
+
+    tell(part: Part): void {
+        for (const [wanted, listener] of this.listeners) if (wanted === part) listener();
+    }
+
+    /** The time of the longest stretch: where the clock was set back, times are not unique. */
+    whole(): [Seconds, Seconds] {
+        const { stretches, from, to } = this.figures.head;
+        const longest = [...stretches].sort((a, b) => b.ticks - a.ticks)[0] ?? { from, to };
+        return [longest.from, Math.max(longest.to, longest.from + leastWindow)];
+    }
+
+    update(figures: Figures): void {
+        const [from, to] = this.whole();
+        const [atFrom, atEnd, atCursor] = [this.from <= from, this.to >= to, this.cursor >= to];
+        this.figures = figures;
+        this.colours = new CellColours(figures.cells.map((stay) => stay.cell));
+        const [newFrom, end] = this.whole();
+        if (atEnd) {
+            this.from = atFrom ? newFrom : this.from + (end - to);
+            this.to = end;
+        }
+        this.tell('data');
+        if (atEnd) this.tell('window');
+        if (atCursor) this.look(end);
+    }
+
+    /** Shows a part of the time. */
+    show(from: Seconds, to: Seconds): void {
+        const [first, last] = this.whole();
+        const size = Math.min(Math.max(to - from, leastWindow), last - first);
+        this.from = Math.min(Math.max(from, first), last - size);
+        this.to = this.from + size;
+        this.tell('window');
+    }
+
+    showAll(): void {
+        this.show(...this.whole());
+    }
+
+    /** Shows half, or twice, the time around the cursor. */
+    zoom(factor: number): void {
+        const middle = Math.min(Math.max(this.cursor, this.from), this.to);
+        this.show(middle - (middle - this.from) * factor, middle + (this.to - middle) * factor);
+    }
+
+    move(share: number): void {
+        const by = share * (this.to - this.from);
+        this.show(this.from + by, this.to + by);
+    }
+
+    /** Looks at an instant. */
+    look(time: Seconds): void {
+        const [first, last] = this.whole();
+        this.cursor = Math.min(Math.max(time, first), last);
+        this.tell('cursor');
+    }
+
+    /** Goes to an instant that may not be shown. */
+    goTo(time: Seconds, until = time): void {
+        if (time < this.from || until > this.to) {
+            const half = Math.max((this.to - this.from) / 2, until - time);
+            this.show((time + until) / 2 - half, (time + until) / 2 + half);
+        }
+        this.look(time);
+    }
+}
