@@ -107,6 +107,9 @@ RequestGate::Verdict RequestGate::decide(const WebRequest& request) {
     if (!cookie || !_setup.session.is(*cookie)) {
         return refused(403, "Open the link that pallax web has printed.");
     }
+    if (request.path == kMetricsPath) {
+        return refused(404, "There are no metrics without --metrics.");
+    }
     return verdict;
 }
 
