@@ -9,16 +9,14 @@
 #include "console/TeeSink.h"
 #include "decoding/FatalRecord.h"
 #include "decoding/Preconditions.h"
-#include "decoding/SnapshotDisplay.h"
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/JoinedRecording.h"
 #include "host/KnowledgeFiles.h"
 #include "host/LogSinks.h"
-#include "host/RecordingFile.h"
 #include "host/RecordingParts.h"
-#include "host/Snapshot.h"
 #include "link/Settings.h"
+#include "link/SourceChild.h"
 #include "telephony/ChildService.h"
 #include "ui/curses/TerminalRestorer.h"
 
@@ -31,15 +29,6 @@
 namespace pallax {
 
 namespace {
-
-/// Ends the child and prints its messages; true if there were none.
-bool endChild(ChildService& child) {
-    child.stop();
-    const std::string complaints = child.takeComplaints(); // lines that start with the program's
-                                                           // name
-    passOnComplaints(complaints);
-    return complaints.empty();
-}
 
 /// The requests of the command line and the settings file.
 struct Request {
@@ -118,55 +107,9 @@ ExitStatus browse(const Request& request, SocketDirectory directory, ChildServic
     }
     const bool isContented = endChild(*child);
     if (!isWhole) {
-        complain(recordingPath(request.options.source)
-                     ? "The service that plays the recording has ended."
-                 : isLive(request.options.source)
-                     ? "The service that watches the modem has ended."
-                     : "The service that simulates the modem has ended.");
+        complain(lostChildSentence(request.options.source));
     }
     return isWhole && isContented ? kExitSuccess : kExitFailure;
-}
-
-/// Why the recording cannot be browsed although it can be read; nothing if it can, or if only its
-/// reader can tell (a stream is read once).
-std::optional<std::string> refusalOf(const Source& source) {
-    const auto* file = std::get_if<FileRecording>(&source);
-    if (file == nullptr) {
-        return std::nullopt;
-    }
-    const Recording::OpenResult recording = openParts(file->parts(), Recording::open);
-    if (!recording) {
-        return std::nullopt; // the child service reports it, as for an unknown link type
-    }
-    return missingGenerator(**recording, technologiesWithSnapshots(SnapshotDisplays::Together));
-}
-
-bool isSnapshot(const Source& source) {
-    const auto* file = std::get_if<FileRecording>(&source);
-    if (file == nullptr) {
-        return false;
-    }
-    const Recording::OpenResult recording = Recording::open(file->path);
-    return recording && (*recording)->technology() == &kSnapshotTechnology;
-}
-
-/// Starts the requested service. A named stream is opened here, where waiting for it can be
-/// reported, and becomes the child's standard input.
-Result<std::unique_ptr<ChildService>, HostError> startChild(const BrowseOptions& options) {
-    const auto* stream = std::get_if<StreamedRecording>(&options.source);
-    if (stream == nullptr || stream->path == "-") {
-        auto started = ChildService::start({options.source, options.play});
-        if (started && isLive(options.source)) {
-            (void)(*started)->takeComplaints(); // the picture says what is waited for
-        }
-        return started;
-    }
-    auto opened = RecordingFile::open(stream->path, complain);
-    if (!opened) {
-        return HostError{opened.error().sentence};
-    }
-    return ChildService::start({StreamedRecording{"-", stream->path}, options.play},
-                               std::move(opened).value().descriptor);
 }
 
 ExitStatus browseWithLog(const Request& request) {
@@ -194,7 +137,7 @@ ExitStatus browseWithLog(const Request& request) {
     const auto* modem = std::get_if<ServiceModem>(&source);
     std::unique_ptr<ChildService> child;
     if (modem == nullptr) {
-        auto started = startChild(request.options);
+        auto started = startChild(source, request.options.play);
         if (!started) {
             complain(started.error().sentence);
             return kExitFailure;

@@ -1,9 +1,9 @@
 #pragma once
 
-#include "browsing/SafePackets.h"
 #include "browsing/TreePrinter.h"
 #include "link/BrowseLink.h"
 #include "link/Settings.h"
+#include "masking/SafePackets.h"
 #include "monitor/DisplayAge.h"
 #include "monitor/PallaxModel.h"
 #include "platform/StandardOutput.h"

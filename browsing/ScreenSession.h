@@ -2,7 +2,6 @@
 
 #include "app/BrowsingSession.h"
 #include "browsing/LinkNotes.h"
-#include "browsing/SafePackets.h"
 #include "browsing/SnapshotOverview.h"
 #include "browsing/ViewedTimeline.h"
 #include "host/FilePreferences.h"
@@ -11,6 +10,7 @@
 #include "knowledge/Quality.h"
 #include "link/BrowseLink.h"
 #include "link/StreamState.h"
+#include "masking/SafePackets.h"
 #include "overview/StatusWatch.h"
 #include "travel/Travel.h"
 #include "ui/terminal/FrontEnd.h"

@@ -7,6 +7,7 @@
 #include "cli/OptionParts.h"
 #include "cli/SharingOptions.h"
 #include "cli/SimulateOptions.h"
+#include "cli/WebArguments.h"
 #include "text/Suggestion.h"
 
 #include <CLI/CLI.hpp>
@@ -108,6 +109,7 @@ CommandLine::CommandLine()
     addDiff(addCommand("diff", "Compare two recordings, or two moments of one"), _diff);
     addWatch(addCommand("watch", "Tell when a condition becomes true"), _watch);
     addReport(addCommand("report", "Make a page of a drive"), _report);
+    addWeb(addCommand("web", "Serve a live page to browsers of this machine"), _web);
     addMask(addCommand("mask", "Copy files without what identifies a person"), _mask);
     addVerify(addCommand("verify", "Tell whether recordings are what they were"), _verify);
     addTexts();
@@ -256,6 +258,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("report")) {
         return _report;
+    }
+    if (_app->got_subcommand("web")) {
+        return _web;
     }
     if (_app->got_subcommand("verify")) {
         return _verify;

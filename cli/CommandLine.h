@@ -49,6 +49,7 @@ private:
     MaskOptions _mask;
     VerifyOptions _verify;
     ReportOptions _report;
+    WebOptions _web;
     SnapshotOptions _snapshot;
     RecordOptions _record;
     ServiceRequest _service;

@@ -2,6 +2,7 @@
 
 #include "host/ServiceName.h"
 #include "telephony/Service.h"
+#include "text/Format.h"
 #include "text/Suggestion.h"
 
 #include <sstream>
@@ -67,6 +68,20 @@ CLI::Option* addLive(CLI::App& app, bool& live, std::optional<std::chrono::nanos
     addDuration(app, duration, "With --live: end after this many seconds")->needs(option);
     addConnect(app, service, "With --live: the service that has this name")->needs(option);
     return option;
+}
+
+Source recordingToBrowse(const std::vector<std::string>& paths) {
+    if (paths.size() == 1) {
+        return recordingAt(paths.front());
+    }
+    const auto parts = recordingInParts(paths);
+    if (!parts) {
+        throw CLI::ValidationError("RECORDING",
+                                   formatText("%@ and %@ are not the numbered parts of "
+                                              "one recording",
+                                              {paths.front(), paths.back()}));
+    }
+    return *parts;
 }
 
 CLI::Option* addSpeed(CLI::App& app, PlayOptions& play) {

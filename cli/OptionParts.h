@@ -2,6 +2,7 @@
 
 #include "cli/Amounts.h"
 #include "host/Recording.h"
+#include "sources/Source.h"
 #include "telephony/PacketPlayer.h"
 #include "text/TimeText.h"
 
@@ -89,6 +90,9 @@ CLI::Option* addConnect(CLI::App& app, std::string& service,
 /// --live, and --for SECONDS and --connect NAME with it.
 CLI::Option* addLive(CLI::App& app, bool& live, std::optional<std::chrono::nanoseconds>& duration,
                      std::string& service);
+
+/// One recording or, of several paths, the one whose parts they are.
+Source recordingToBrowse(const std::vector<std::string>& paths);
 
 /// --speed X|max.
 CLI::Option* addSpeed(CLI::App& app, PlayOptions& play);

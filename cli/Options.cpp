@@ -170,21 +170,6 @@ void addPlay(CLI::App& app, PlayOptions& play, CLI::Option* recording) {
     app.add_flag("--loop", play.loop, "Restart at the end of the recording")->needs(recording);
 }
 
-/// One recording or, of several paths, the one whose parts they are.
-Source recordingToBrowse(const std::vector<std::string>& paths) {
-    if (paths.size() == 1) {
-        return recordingAt(paths.front());
-    }
-    const auto parts = recordingInParts(paths);
-    if (!parts) {
-        throw CLI::ValidationError("RECORDING",
-                                   formatText("%@ and %@ are not the numbered parts of "
-                                              "one recording",
-                                              {paths.front(), paths.back()}));
-    }
-    return *parts;
-}
-
 void addConnections(CLI::App& app, BrowseOptions& options, CLI::Option& recording) {
     const auto take = [&options](const std::vector<std::string>& names) {
         std::vector<ServiceModem> modems;

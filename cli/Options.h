@@ -19,6 +19,7 @@
 #include "telephony/Service.h"
 #include "verifying/VerifyCommand.h"
 #include "watching/WatchCommand.h"
+#include "web/WebOptions.h"
 
 #include <string>
 #include <variant>
@@ -49,7 +50,7 @@ using ParsedOptions =
                  ServiceListOptions, SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions,
                  InfoOptions, SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
                  MaskOptions, VerifyOptions, ReportOptions, ModemListOptions, ModemPolicyOptions,
-                 ParseEnd>;
+                 WebOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

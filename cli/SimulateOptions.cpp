@@ -75,27 +75,24 @@ CLI::Option* addSeconds(CLI::App& app, const std::function<void(std::chrono::sec
         ->type_name("N");
 }
 
-CLI::Option* addTechnology(CLI::App& app, const std::string& name,
-                           const std::function<void(const RecordedTechnology*)>& take,
-                           const std::string& description) {
+std::string simulatedNames() {
     std::string names;
     for (const RecordedTechnology* each : simulatedTechnologies()) {
         names += names.empty() ? "" : "|";
         names += each->commandName;
     }
+    return names;
+}
+
+CLI::Option* addTechnology(CLI::App& app, const std::string& name,
+                           const std::function<void(const RecordedTechnology*)>& take,
+                           const std::string& description) {
     return app
         .add_option_function<std::string>(
             name,
-            [take, name, names](const std::string& text) {
-                for (const RecordedTechnology* each : simulatedTechnologies()) {
-                    if (each->commandName == text) {
-                        return take(each);
-                    }
-                }
-                throw unknownChoice(name, text, names);
-            },
+            [take, name](const std::string& text) { take(simulatedTechnologyNamed(name, text)); },
             description)
-        ->type_name(names);
+        ->type_name(simulatedNames());
 }
 
 void addCommon(CLI::App& app, SimulationOptions& simulation) {
@@ -104,6 +101,16 @@ void addCommon(CLI::App& app, SimulationOptions& simulation) {
 }
 
 } // namespace
+
+const RecordedTechnology* simulatedTechnologyNamed(const std::string& option,
+                                                   const std::string& name) {
+    for (const RecordedTechnology* each : simulatedTechnologies()) {
+        if (each->commandName == name) {
+            return each;
+        }
+    }
+    throw unknownChoice(option, name, simulatedNames());
+}
 
 const RecordedTechnology* usualSimulatedTechnology() {
     return technologyOfCommandName("lte");

@@ -4,6 +4,8 @@
 #include "sources/Source.h"
 #include "telephony/PacketPlayer.h"
 
+#include <string>
+
 namespace CLI {
 class App;
 class Option;
@@ -13,6 +15,10 @@ namespace pallax {
 
 /// The technology that `demo` shows when none is named.
 const RecordedTechnology* usualSimulatedTechnology();
+
+/// The one with this name; throws, with the name of the option, if it cannot be simulated.
+const RecordedTechnology* simulatedTechnologyNamed(const std::string& option,
+                                                   const std::string& name);
 
 /// Adds the options of demo: `[TECHNOLOGY] --seed --rate --seconds --speed`.
 void addDemo(CLI::App& app, SimulationOptions& simulation, PlayOptions& play);

@@ -11,6 +11,7 @@
 #include "live/LiveEvents.h"
 #include "recording/Record.h"
 #include "telephony/ChildService.h"
+#include "web/WebCommand.h"
 
 #include <csignal>
 #include <exception>
@@ -50,6 +51,7 @@ struct Run {
     ExitStatus operator()(const MaskOptions& options) const { return runMask(options); }
     ExitStatus operator()(const VerifyOptions& options) const { return runVerify(options); }
     ExitStatus operator()(const ReportOptions& options) const { return runReport(options); }
+    ExitStatus operator()(const WebOptions& options) const { return runWeb(options); }
     ExitStatus operator()(const ModemListOptions& options) const { return runModemList(options); }
     ExitStatus operator()(const ModemPolicyOptions& options) const {
         return runModemPolicy(options);

@@ -53,14 +53,14 @@ std::optional<std::string> PacketReceiver::run() {
 void PacketReceiver::start() {
     AsioMainQueue& queue = _link.queue();
     queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [this](int /*signal*/) { stop(); });
-    _link.clock().onEnd([this] { stop(); });
+    _link.clock().onEnd(_setup.ended ? _setup.ended : [this] { stop(); });
     queue.async([this] { _modem.startMonitor(); });
     _notice.emplace(WaitNotice::Setup{queue, [this] { return _modem.isConnected(); },
                                       [this] { return _link.obstacle(); }, _setup.waits});
     if (_link.hasChild()) {
         _looks = queue.scheduleRepeating(BrowseLink::kLookInterval, [this] {
             if (_link.childHasEnded()) {
-                fail("The service of the recorder has ended.");
+                fail(_setup.lostChild);
             }
         });
     }

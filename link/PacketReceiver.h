@@ -36,6 +36,9 @@ public:
         std::optional<std::chrono::nanoseconds> duration = {};
         /// The service to connect to; null: the machine's own.
         ChildService* child = nullptr;
+        std::string lostChild = "The service of the recorder has ended."; ///< the failure, then
+        /// Called at the end of the source; if missing, that is the end of receiving, too.
+        std::function<void()> ended = {};
     };
 
     explicit PacketReceiver(Setup setup);

@@ -5,7 +5,6 @@
 #include "host/Complaint.h"
 #include "host/LogSinks.h"
 #include "link/PacketReceiver.h"
-#include "link/WaitNotice.h"
 #include "text/Format.h"
 
 #include <utility>
@@ -30,20 +29,36 @@ std::optional<std::string> LiveSession::run() {
     return receive(std::move(directory).value());
 }
 
+void LiveSession::add(const RecordedTechnology& technology, Time stamp, Bytes packet) {
+    if (_setup.masked) {
+        _timeline->add(technology, stamp, _setup.masked(technology, packet));
+    } else {
+        _timeline->add(technology, stamp, packet);
+    }
+}
+
 std::optional<std::string> LiveSession::receive(SocketDirectory directory) {
     PacketReceiver receiver({std::move(directory), "Timeline", _setup.wanted,
                              [this](const RecordedTechnology& technology, Time stamp,
-                                    Bytes packet) { _timeline->add(technology, stamp, packet); },
-                             complainOfWaiting, _setup.duration});
+                                    Bytes packet) { add(technology, stamp, packet); },
+                             _setup.waits, _setup.duration, _setup.child, _setup.lostChild,
+                             _setup.ended});
     const auto indexed = [this, &receiver](Timeline& timeline) {
         _setup.indexed(timeline);
-        if (timeline.hasEnded()) {
+        if (timeline.hasEnded() && !_setup.ended) {
             receiver.stop();
         }
     };
-    _timeline = std::make_unique<LiveTimeline>(
-        LiveTimeline::Setup{receiver.queue(), _resources, _bundle, technologies(),
-                            _setup.settings.journal, complain, indexed});
+    _timeline =
+        std::make_unique<LiveTimeline>(LiveTimeline::Setup{.queue = receiver.queue(),
+                                                           .resources = _resources,
+                                                           .bundle = _bundle,
+                                                           .technologies = technologies(),
+                                                           .journal = _setup.settings.journal,
+                                                           .report = complain,
+                                                           .indexed = indexed,
+                                                           .replaced = _setup.replaced});
+    const auto served = _setup.began ? _setup.began(receiver.queue()) : nullptr;
     auto failure = receiver.run();
     _timeline->finish();
     return failure;

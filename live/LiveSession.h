@@ -4,6 +4,7 @@
 #include "host/BuildBundle.h"
 #include "host/SocketDirectory.h"
 #include "link/Settings.h"
+#include "link/WaitNotice.h"
 #include "live/LiveTimeline.h"
 
 #include <chrono>
@@ -14,6 +15,9 @@
 #include <vector>
 
 namespace pallax {
+
+class AsioMainQueue;
+class ChildService;
 
 /// That no packet has come from the live modem, or from the one of the service with this name: one
 /// sentence.
@@ -27,7 +31,20 @@ public:
         const RecordedTechnology* wanted = nullptr; ///< as for PacketReceiver
         std::optional<std::chrono::nanoseconds> duration = {};
         std::function<void(Timeline& timeline)> indexed = [](Timeline&) {}; ///< as for LiveTimeline
-        std::string service = {}; ///< its name; empty: the one without a name
+        std::string service = {};      ///< its name; empty: the one without a name
+        ChildService* child = nullptr; ///< as for PacketReceiver
+        std::string lostChild = {};    ///< likewise
+        /// What is kept and decoded in place of a packet; if missing, the packet itself.
+        std::function<ByteBuffer(const RecordedTechnology& technology, Bytes packet)> masked = {};
+        /// Called before anything is received, with the queue that runs until the end. What it
+        /// returns is destroyed before the queue.
+        std::function<std::shared_ptr<void>(AsioMainQueue& queue)> began = {};
+        std::function<void()> replaced = [] {}; ///< as for LiveTimeline
+        /// Called at the end of the source. If present, neither that nor a fatal record ends the
+        /// session.
+        std::function<void()> ended = {};
+        /// As for PacketReceiver.
+        std::function<void(const std::string& text)> waits = complainOfWaiting;
     };
 
     /// The settings must outlive the session.
@@ -48,6 +65,7 @@ public:
 
 private:
     std::optional<std::string> receive(SocketDirectory directory);
+    void add(const RecordedTechnology& technology, Time stamp, Bytes packet);
 
     Setup _setup;
     RequiredTemplates _resources;

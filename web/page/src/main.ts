@@ -2,6 +2,7 @@
 import './style.css';
 import { h } from './dom.js';
 import { embeddedJson, FrozenSource } from './frozen.js';
+import { LiveSource } from './live.js';
 import type { TrackPoint } from './logic/track.js';
 import { Model } from './model.js';
 import type { Source } from './source.js';
@@ -17,8 +18,21 @@ import { verdictView } from './views/verdict.js';
 
 const has = (id: string): boolean => document.getElementById(id) !== null;
 
+/** What the server waits for stands above the page, as plain text. */
+function liveSource(): LiveSource {
+    const words = h('p', { class: 'note', role: 'status', hidden: true });
+    document.getElementById('page')!.before(words);
+    const source = new LiveSource();
+    source.onWords = (text) => {
+        words.textContent = text;
+        words.hidden = text === '';
+    };
+    return source;
+}
+
 async function sources(): Promise<Source[]> {
     const places = [0, 1].filter((place) => has(`figures-${place}`));
+    if (places.length === 0) return [liveSource()];
     return Promise.all(places.map((place) => FrozenSource.read(place)));
 }
 

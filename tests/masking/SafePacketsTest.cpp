@@ -1,4 +1,4 @@
-#include "browsing/SafePackets.h"
+#include "masking/SafePackets.h"
 
 #include "host/DirectoryResources.h"
 #include "host/Snapshot.h"

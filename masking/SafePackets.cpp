@@ -1,4 +1,4 @@
-#include "browsing/SafePackets.h"
+#include "masking/SafePackets.h"
 
 #include "host/Snapshot.h"
 #include "masking/SnapshotMask.h"

@@ -12,8 +12,8 @@ namespace pallax {
 
 class Resources;
 
-/// The packets of a safe screen: masked as they arrive, before anything decodes, keeps, searches or
-/// saves them, so nothing that the viewer can do shows an identity. Until the technology is known,
+/// The packets of a live session, masked as they arrive, before anything decodes, keeps, searches or
+/// saves them, so nothing that a viewer can do shows an identity. Until the technology is known,
 /// and of an unknown one, packets are zeros.
 class SafePackets {
 public:

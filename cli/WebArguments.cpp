@@ -1,0 +1,131 @@
+#include "cli/WebArguments.h"
+
+#include "cli/OptionParts.h"
+#include "cli/SimulateOptions.h"
+
+#include <CLI/CLI.hpp>
+
+#include <limits>
+
+namespace pallax {
+
+namespace {
+
+constexpr const char* kWebFooter = R"(Examples:
+  pallax web                           the live modem
+  pallax web drive.pcapng --speed max  a recording
+  pallax web demo lte                  a simulated modem
+  pallax web --connect car1 --open     the modem of a service, in the browser
+  pallax web --port 8080 --metrics     also for a collector of metrics
+
+Prints a link and serves a page at it until Ctrl-C: what pallax report shows,
+while it happens. The page says what the serving cell was and is, draws levels
+and neighbours, lists events, and has the whole state at any time since then.
+A recording is played at its own pace; --speed max shows all of it at once. A
+recording with the name "demo" needs its folder (pallax web ./demo).
+
+The link holds a secret that is another one at each start; without it, nobody
+gets anything. Only programs of this machine can connect. From another machine,
+forward the port, which needs neither --listen nor a certificate:
+
+  ssh -L 8080:127.0.0.1:8080 car pallax web --port 8080
+
+--listen ADDRESS lets others of the network connect, who still need the link.
+Without --certificate and --key, they can read along on the way.
+
+What identifies a person, a device or a subscription is masked as it arrives,
+unless --with-identities is given.
+
+With --metrics, programs of this machine get /metrics without the secret:
+levels with their grades, states, the serving cell and counts, for Prometheus
+and other collectors of OpenMetrics. They tell where the phone is, but not
+whose it is, even with --with-identities.
+
+Exit status:
+  0   success: ended by Ctrl-C, or the reader of the output has gone
+  1   failure, explained in one sentence on standard error
+  2   wrong usage)";
+
+/// "demo" as the first word is a command of this one, because CLI11 would take it for that of the
+/// program.
+CLI::App& addDemo(CLI::App& app, WebOptions& options) {
+    CLI::App& demo = *app.add_subcommand("demo", "A simulated modem");
+    demo.group("")->fallthrough();
+    const auto take = [&options](const std::string& name) {
+        std::get<SimulationOptions>(options.source).technology =
+            simulatedTechnologyNamed("TECHNOLOGY", name);
+    };
+    demo.preparse_callback([&options](std::size_t /*words*/) {
+        options.source.emplace<SimulationOptions>().technology = usualSimulatedTechnology();
+    });
+    demo.add_option_function<std::string>("TECHNOLOGY", take,
+                                          "Technology of the simulated modem (default: lte)")
+        ->type_name("");
+    return demo;
+}
+
+void addListening(CLI::App& app, WebOptions& options) {
+    app.add_option_function<std::string>(
+           "--port",
+           [&options](const std::string& text) {
+               options.port = numberOf<std::uint16_t>("--port", text, 1,
+                                                      std::numeric_limits<std::uint16_t>::max());
+           },
+           "Listen on this port (default: one that is free)")
+        ->type_name("N");
+    app.add_option("--listen", options.address,
+                   "Listen on this address of the machine, for others of the network (default: "
+                   "127.0.0.1)")
+        ->type_name("ADDRESS");
+    CLI::Option* certificate =
+        app.add_option("--certificate", options.certificate, "Encrypt with this certificate (PEM)")
+            ->type_name("FILE");
+    app.add_option("--key", options.key, "The certificate's key (PEM)")
+        ->needs(certificate)
+        ->type_name("FILE");
+    certificate->needs("--key");
+    app.add_flag("--metrics", options.metrics,
+                 "Serve /metrics to programs of this machine, without the link's secret");
+}
+
+} // namespace
+
+void addWeb(CLI::App& app, WebOptions& options) {
+    CLI::Option* source =
+        app.add_option_function<std::vector<std::string>>(
+               "RECORDING",
+               [&options](const std::vector<std::string>& words) {
+                   options.source = recordingToBrowse(words);
+               },
+               "The recording (pcap or pcapng; - is standard input) or its numbered parts, or "
+               "demo [TECHNOLOGY] for a simulated modem (default: the live modem)")
+            ->type_name("");
+    app.add_option_function<std::string>(
+           "--connect",
+           [&options](const std::string& name) {
+               options.source = ServiceModem{serviceNameOf("--connect", name)};
+           },
+           "The live modem of the service that has this name")
+        ->excludes(source)
+        ->type_name("NAME");
+    addListening(app, options);
+    app.add_flag("--open", options.open, "Open the page in the browser (xdg-open)");
+    app.add_option("--profile", options.profile,
+                   "The profile that judges levels (default: android, or that of pallax.conf)")
+        ->type_name("android|field|operator|NAME");
+    app.add_flag("--with-identities", options.withIdentities,
+                 "Do not mask what identifies a person");
+    CLI::Option* speed = addSpeed(app, options.play);
+    CLI::App& demo = addDemo(app, options);
+    app.callback([&demo, source, speed] {
+        if (demo.parsed() && !source->empty()) {
+            throw CLI::ValidationError("demo", "it is shown alone, without a recording");
+        }
+        if (!demo.parsed() && source->empty() && !speed->empty()) {
+            throw CLI::ValidationError("--speed", "only a recording or a demo has a speed");
+        }
+    });
+    app.footer(kWebFooter);
+}
+
+} // namespace pallax

@@ -1,0 +1,126 @@
+#include "web/LiveData.h"
+
+#include "decoding/DisplayJson.h"
+#include "fields/Reference.h"
+#include "platform/RecordedTechnology.h"
+#include "timeline/Timeline.h"
+#include "web/SeriesJson.h"
+
+#include <algorithm>
+#include <chrono>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr std::chrono::seconds kGap{60}; // as an event "gap"
+
+} // namespace
+
+LiveData::LiveData(Setup setup) : _setup(std::move(setup)) {
+    begin(nullptr);
+}
+
+LiveData::~LiveData() = default;
+
+void LiveData::begin(Timeline* timeline) {
+    _follower.reset();
+    _timeline = timeline;
+    _report = std::make_unique<ReportBuilder>(_setup.names, _setup.profile);
+    _ticks.clear();
+    _stateTick = 0;
+    _isUpToDate = false;
+    if (timeline != nullptr) {
+        _follower = std::make_unique<TickFollower>(*timeline);
+        const auto* technology = technologyOfCommandName(timeline->fields().technology());
+        _setup.head.technology = gatherReference(*technology, _setup.resources).title;
+    }
+}
+
+bool LiveData::follow(const std::function<bool()>& mayContinue) {
+    return _follower == nullptr ||
+           _follower->follow([this](const auto& tick, const auto& values) { take(tick, values); },
+                             mayContinue);
+}
+
+void LiveData::settle() {
+    if (_follower != nullptr) {
+        _follower->settle([this](const auto& tick, const auto& values) { take(tick, values); });
+    }
+}
+
+/// The builder keeps no displays: the timeline makes that of any tick again.
+void LiveData::take(const ShownTick& tick, const CurrentValues& values) {
+    const Time time = tick.tick.time;
+    const bool isAfterStep = !_ticks.empty() && (time < _ticks.back().tick.time ||
+                                                 time - _ticks.back().tick.time > kGap);
+    _report->take({time, values, PropertyList(), isAfterStep});
+    _ticks.push_back(tick);
+    _isUpToDate = false;
+}
+
+const JsonMembers& LiveData::figures() {
+    if (!_isUpToDate) {
+        _isUpToDate = true;
+        _figures = _timeline != nullptr ? JsonMembers(gatherFigures()) : JsonMembers();
+    }
+    return _figures;
+}
+
+Dictionary LiveData::gatherFigures() const {
+    ReportHead head = _setup.head;
+    head.packets = _timeline->packets();
+    for (std::string& note : _timeline->notes()) {
+        head.notes.push_back(std::move(note));
+    }
+    return figuresOf(head, *_report, _timeline->events(), _timeline->fields());
+}
+
+std::string LiveData::series(const std::vector<std::uint32_t>& ids,
+                             const SeriesRange& range) const {
+    static const HeldSeries kNone;
+    std::vector<const HeldSeries*> series;
+    for (const std::uint32_t id : ids) {
+        const HeldSeries* found = &kNone;
+        for (const ReportMeasure& measure : _report->measures()) {
+            found = measure.id == id ? &measure.series : found;
+        }
+        for (const ReportNeighbour& neighbour : _report->neighbours()) {
+            found = neighbour.id == id ? &neighbour.series : found;
+        }
+        series.push_back(found);
+    }
+    return seriesJson(_report->ticks(), series, range);
+}
+
+std::optional<std::string> LiveData::state(Time at) {
+    const auto found = std::find_if(_ticks.rbegin(), _ticks.rend(),
+                                    [at](const ShownTick& tick) { return tick.tick.time <= at; });
+    if (_ticks.empty()) {
+        return std::nullopt;
+    }
+    const ShownTick& shown = found != _ticks.rend() ? *found : _ticks.front();
+    if (shown.packet < _timeline->firstInstant()) {
+        return std::nullopt;
+    }
+    if (_stateTick != shown.tick.number) {
+        _state = "{\"time\":";
+        appendJson(_state, PropertyList::real(pageSeconds(shown.tick.time)));
+        _state += ",\"tick\":" + std::to_string(shown.tick.number) + ",\"display\":";
+        appendJson(_state, _timeline->displayAt(shown.packet));
+        _state += '}';
+        _stateTick = shown.tick.number;
+    }
+    return _state;
+}
+
+std::optional<Status> LiveData::status() const {
+    if (_timeline == nullptr || _timeline->packets() == 0) {
+        return std::nullopt;
+    }
+    const CurrentValues& values = _timeline->latestValues();
+    return statusOf(values, values.time(), _setup.names, _setup.profile);
+}
+
+} // namespace pallax
