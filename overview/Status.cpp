@@ -123,7 +123,7 @@ private:
                           held.second.text() == condition.text;
                });
     }
-    /// Finds a field's value where a cell is told; null if it names nothing.
+    /// The value of a field, of the display or of one entry of a list; null if there is none.
     using Find = std::function<const FieldValue*(std::string_view field)>;
 
     void addCell(const StatusCellFields& rule);

@@ -9,6 +9,7 @@ namespace pallax {
 
 namespace {
 
+/// The first of the values, at most so many: a message may hold any number.
 Dictionary someOf(const Dictionary& values, std::size_t most) {
     Dictionary some;
     for (const Dictionary::Entry& entry : values) {
