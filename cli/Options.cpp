@@ -35,6 +35,7 @@ constexpr const char* kFooter = R"(Examples:
   pallax diff drive.pcap@14:02 drive.pcap@14:03     what has changed
   pallax sql drive.pcap 'select ...'   any question
   pallax watch 'measured_rsrp < -110'  tell when a condition becomes true
+  pallax web --open                    see the live modem in the web browser
 
 The numbered parts of a recording (drive-0001.pcapng drive-0002.pcapng) are
 browsed as one, in the order of their times.
