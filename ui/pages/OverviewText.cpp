@@ -17,9 +17,11 @@ namespace {
 
 constexpr int kBetweenCells = 2; // columns of a table
 constexpr int kBarColumns = 8;
-constexpr int kNameColumns = 12; // of a block's name beside its rows
-constexpr int kLeastBeside = 60; // a narrower column has the names above the rows
-constexpr int kTall = 30;        // rows that have room for blank ones and longer lists
+constexpr int kMostCurveColumns = 24;
+constexpr int kFewestCurveColumns = 12; // fewer tell nothing
+constexpr int kNameColumns = 12;        // of a block's name beside its rows
+constexpr int kLeastBeside = 60;        // a narrower column has the names above the rows
+constexpr int kTall = 30;               // rows that have room for blank ones and longer lists
 constexpr Style kName{.bold = true};
 constexpr Style kPale{.dim = true};
 
@@ -60,7 +62,9 @@ private:
     std::vector<TextRow> table(std::vector<std::vector<TableText>> rows) const;
     std::vector<TableText> levelCells(std::string name, const StatusValue& level) const;
     std::string bar(const StatusValue& level) const;
-    std::string curve(const StatusValue& level) const;
+    std::string curve(const StatusValue& level, int columns) const;
+    /// The columns beside such a table.
+    int roomBeside(const std::vector<std::vector<TableText>>& rows) const;
 
     const Overview& _overview;
     const Status& _status;
@@ -89,9 +93,7 @@ std::vector<TextRow> Blocks::wrapped(const std::vector<std::string>& words) cons
     return rows;
 }
 
-/// Rows of cells with aligned columns. Columns that do not fit are left out, starting with the
-/// last.
-std::vector<TextRow> Blocks::table(std::vector<std::vector<TableText>> rows) const {
+std::vector<int> widthsOf(const std::vector<std::vector<TableText>>& rows) {
     std::vector<int> widths;
     for (const auto& row : rows) {
         widths.resize(std::max(widths.size(), row.size()));
@@ -99,6 +101,21 @@ std::vector<TextRow> Blocks::table(std::vector<std::vector<TableText>> rows) con
             widths[index] = std::max(widths[index], columnsOf(row[index].text));
         }
     }
+    return widths;
+}
+
+int Blocks::roomBeside(const std::vector<std::vector<TableText>>& rows) const {
+    int room = _columns;
+    for (const int width : widthsOf(rows)) {
+        room -= width > 0 ? width + kBetweenCells : 0;
+    }
+    return room;
+}
+
+/// Rows of cells with aligned columns. Columns that do not fit are left out, starting with the
+/// last.
+std::vector<TextRow> Blocks::table(std::vector<std::vector<TableText>> rows) const {
+    const std::vector<int> widths = widthsOf(rows);
     std::vector<TextRow> shown;
     for (auto& row : rows) {
         TextRow& text = shown.emplace_back();
@@ -132,12 +149,10 @@ std::string Blocks::bar(const StatusValue& level) const {
     return text;
 }
 
-std::string Blocks::curve(const StatusValue& level) const {
-    constexpr int kCurveColumns = 24;
+std::string Blocks::curve(const StatusValue& level, int columns) const {
     for (const Overview::LevelCurve& each : _overview.curves) {
         if (each.leaf.field == level.field && each.leaf.entry == level.entry) {
-            return sparkline(_marks, each.curve, _overview.curvesFrom, _overview.curvesTo,
-                             kCurveColumns);
+            return sparkline(_marks, each.curve, _overview.curvesFrom, _overview.curvesTo, columns);
         }
     }
     return "";
@@ -191,14 +206,19 @@ std::vector<Block> Blocks::cells() const {
 
 Block Blocks::levels() const {
     std::vector<std::vector<TableText>> rows;
+    std::vector<const StatusValue*> levels;
     bool isGraded = false;
     for (const StatusCell& cell : _status.cells) {
         for (const StatusValue& level : cell.levels) {
+            levels.push_back(&level);
             rows.push_back(levelCells(systemOf(cell.system) + level.name, level));
             rows.back().push_back({oldAgeWords(_status.time, {&level}), kPale});
-            rows.back().push_back({curve(level)});
             isGraded = isGraded || level.grade;
         }
+    }
+    const int room = std::min(roomBeside(rows), kMostCurveColumns);
+    for (std::size_t row = 0; room >= kFewestCurveColumns && row < rows.size(); ++row) {
+        rows[row].push_back({curve(*levels[row], room)});
     }
     Block block{"Levels", table(std::move(rows))};
     block.namesItself = true;

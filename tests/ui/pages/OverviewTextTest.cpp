@@ -284,5 +284,40 @@ TEST(OverviewText, OfAnObjectStreamHasWhatItsMessagesTell) {
 )");
 }
 
+/// The curves of the levels of a sample, which all rise, in this many columns.
+std::vector<std::string> curvesIn(int columns) {
+    Overview overview = overviewOf("cdma-drive");
+    overview.curvesTo = overview.curvesFrom + std::chrono::seconds(9);
+    Curve rising{{}, std::chrono::seconds(2), false};
+    for (int second = 0; second < 10; ++second) {
+        const double value = second;
+        rising.points.push_back(
+            {overview.curvesFrom + std::chrono::seconds(second), value, value, value, value});
+    }
+    for (const StatusCell& cell : overview.status.cells) {
+        for (const StatusValue& level : cell.levels) {
+            overview.curves.push_back({{level.field, level.entry, ""}, rising});
+        }
+    }
+    std::vector<std::string> curves;
+    const OverviewText text = overviewText(overview, kAsciiMarks, {0, columns}, 24);
+    for (const TextRow& row : text.columns.at(0).rows) {
+        for (const TextPiece& piece : row) {
+            if (piece.text.find("__") != std::string::npos) {
+                curves.push_back(piece.text);
+            }
+        }
+    }
+    return curves;
+}
+
+TEST(OverviewText, CurvesTakeTheRoomBesideTheLevels) {
+    using Curves = std::vector<std::string>;
+    EXPECT_EQ(curvesIn(90), Curves(4, "_____........--------'''"));
+    EXPECT_EQ(curvesIn(80), Curves(4, "____........-------'''"));
+    EXPECT_EQ(curvesIn(70), Curves(4, "__....----''"));
+    EXPECT_EQ(curvesIn(68), Curves());
+}
+
 } // namespace
 } // namespace pallax::terminal
