@@ -145,6 +145,9 @@ void addReport(CLI::App& app, ReportOptions& options) {
     app.add_option("--where", options.where, "Only the display ticks for which this holds")
         ->type_name("CONDITION");
     app.add_option("--title", options.title, "The title of the page")->type_name("TEXT");
+    app.add_option("--label", options.labels, "What the device is called, once for each recording")
+        ->type_name("TEXT")
+        ->allow_extra_args(false);
     app.add_option("--track", options.track, "Draw the way in this GPX file")->type_name("FILE");
     app.add_flag("--with-identities", options.withIdentities,
                  "Keep what identifies a person, and say so");

@@ -13,6 +13,7 @@ struct DisplayColumns::Node {
     std::string key;
     Column column = {};
     std::uint32_t text = 0;                           ///< that is shown now
+    bool isLeftOut = false;                           ///< its text, if it is a leaf
     bool isShown = false;                             ///< it, or something below it
     std::uint32_t seen = 0;                           ///< the latest tick that showed it, plus 1
     std::vector<std::unique_ptr<Node>> children = {}; ///< in the order of the display
@@ -27,7 +28,8 @@ std::string textOf(const PropertyList& leaf) {
 
 } // namespace
 
-DisplayColumns::DisplayColumns() : _root(std::make_unique<Node>()), _texts{{}} {}
+DisplayColumns::DisplayColumns(IsLeftOut isLeftOut)
+    : _isLeftOut(std::move(isLeftOut)), _root(std::make_unique<Node>()), _texts{{}} {}
 
 DisplayColumns::~DisplayColumns() = default;
 
@@ -54,7 +56,7 @@ void DisplayColumns::take(Node& node, const PropertyList& value) {
         }
     }
     const bool isLeaf = !value.dictionary() && !value.array() && !value.isNull();
-    change(node, isLeaf ? numberOf(textOf(value)) : 0);
+    change(node, isLeaf ? numberOf(node.isLeftOut ? std::string(kLeftOut) : textOf(value)) : 0);
     for (const auto& child : node.children) {
         if (child->isShown && child->seen != _tick + 1) {
             leave(*child);
@@ -81,6 +83,7 @@ DisplayColumns::Node& DisplayColumns::childOf(Node& node, std::size_t place, std
     auto child = std::make_unique<Node>(Node{std::string(key)});
     child->column.path = node.column.path;
     child->column.path.emplace_back(key);
+    child->isLeftOut = _isLeftOut && _isLeftOut(child->column.path);
     return **children.insert(after.base(), std::move(child));
 }
 

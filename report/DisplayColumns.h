@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -11,6 +12,9 @@
 #include <vector>
 
 namespace pallax {
+
+/// Whether the value at a path of the display is masked, so that it is not shown as what is left.
+using IsLeftOut = std::function<bool(const std::vector<std::string>& path)>;
 
 /// The display at every tick, as one column for each place in it, kept where it changes.
 class DisplayColumns {
@@ -27,7 +31,10 @@ public:
         std::vector<Change> changes;
     };
 
-    DisplayColumns();
+    /// The text of a value that is left out.
+    static constexpr std::string_view kLeftOut = "left out";
+
+    explicit DisplayColumns(IsLeftOut isLeftOut = {});
     ~DisplayColumns();
     DisplayColumns(const DisplayColumns&) = delete;
     DisplayColumns& operator=(const DisplayColumns&) = delete;
@@ -50,6 +57,7 @@ private:
     std::uint32_t numberOf(std::string text);
     static void gather(const Node& node, std::vector<const Column*>& columns);
 
+    IsLeftOut _isLeftOut;
     std::unique_ptr<Node> _root;
     std::unordered_map<std::string, std::uint32_t> _numbers;
     std::vector<std::string_view> _texts;

@@ -112,7 +112,7 @@ void ReportBuilder::take(const ReportTick& tick) {
         settle(tick.isAfterStep ? latest : std::min(tick.time, latest));
     }
     if (isFirst || tick.time < _ticks.back()) {
-        _stretches.push_back(static_cast<std::uint32_t>(_ticks.size()));
+        _stretches.push_back({static_cast<std::uint32_t>(_ticks.size()), tick.firstPacket});
     }
     _ticks.push_back(tick.time);
     _display.add(this->tick(), tick.display);
@@ -152,7 +152,7 @@ void ReportBuilder::settleLevels(double seconds) {
             if (isKnown(level, _pending->time)) {
                 ReportMeasure& measure = measureOf(cell, level);
                 measure.spread.add(level.number, seconds);
-                measure.worst.add(_pending->time, seconds, level.number);
+                measure.worst.add(_pending->time, seconds, level.number, stretch());
             }
         }
     }
@@ -186,23 +186,30 @@ void ReportBuilder::settleNeighbours(double seconds) {
 void ReportBuilder::settleLanes(Time until) {
     const Time from = _pending->time;
     for (const StatusValue& state : _pending->status.states) {
-        _states[state.name].add(from, until, state.text);
+        _states[state.name].add({from, until, state.text, stretch()});
     }
+    settleContexts(until);
+    for (auto& [system, place] : _current) {
+        _stays[place].to = until;
+    }
+}
+
+void ReportBuilder::settleContexts(Time until) {
     std::set<std::string> active;
     for (const StatusContext& context : _pending->status.contexts) {
-        if (_contexts.size() < kMostNeighbours || _contexts.contains(context.name)) {
-            _contexts[context.name].add(from, until,
-                                        context.state.empty() ? "there" : context.state);
-            active.insert(context.name);
+        const std::string name =
+            _hasContextNames ? context.name : "context " + std::to_string(active.size() + 1);
+        if (_contexts.size() < kMostNeighbours || _contexts.contains(name)) {
+            const bool isTold = _hasContextNames && !context.state.empty();
+            _contexts[name].add(
+                {_pending->time, until, isTold ? context.state : "there", stretch()});
+            active.insert(name);
         }
     }
     for (auto& [name, lane] : _contexts) {
         if (!active.contains(name)) {
-            lane.add(from, until, "");
+            lane.add({_pending->time, until, "", stretch()});
         }
-    }
-    for (auto& [system, place] : _current) {
-        _stays[place].to = until;
     }
 }
 
@@ -253,7 +260,8 @@ void ReportBuilder::addStays(const Status& status, const ReportTick& tick) {
         noteServing(cell, tick.values.fields().technology(), current != _current.end());
         if (_stays.size() < kMostStays) {
             _current[cell.system] = _stays.size();
-            _stays.push_back({cell.system, words, detailsOf(cell), tick.time, tick.time});
+            _stays.push_back(
+                {cell.system, words, detailsOf(cell), tick.time, tick.time, stretch()});
         }
     }
 }

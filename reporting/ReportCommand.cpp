@@ -5,6 +5,7 @@
 #include "decoding/StateCondition.h"
 #include "fields/Reference.h"
 #include "host/Files.h"
+#include "masking/MaskPlan.h"
 #include "masking/MaskedJournal.h"
 #include "platform/Bundle.h"
 #include "platform/Clock.h"
@@ -35,6 +36,26 @@ std::string shownName(const PartPaths& paths) {
     return std::filesystem::path(isSeveral ? part->whole : paths.front()).filename().string();
 }
 
+/// Null if there is nothing wrong with the number of recordings.
+const char* refusalOf(std::size_t recordings, const ReportOptions& options) {
+    if (recordings > ReportCommand::kMostRecordings) {
+        return "report takes one recording, or two to compare (see pallax report --help)";
+    }
+    if (options.labels.size() > recordings) {
+        return "--label is for one recording each (see pallax report --help)";
+    }
+    return nullptr;
+}
+
+/// What the masked packets of a technology do not show.
+IsLeftOut leftOutOf(const RecordedTechnology& technology, const Resources& resources) {
+    const auto plan = std::make_shared<MaskPlan>(technology, resources, MaskChoice());
+    return [plan](const ScalarPath& path) {
+        return plan->ofDisplay(path) == MaskAction::Mask ||
+               (plan->areObjects() && std::any_of(path.begin(), path.end(), isPersonalKey));
+    };
+}
+
 TimeSpan spanOf(const Timeline& timeline) {
     TimeSpan span;
     for (const Stretch& stretch : timeline.stretches()) {
@@ -48,14 +69,13 @@ TimeSpan spanOf(const Timeline& timeline) {
 } // namespace
 
 std::optional<std::string> ReportCommand::make(ExitStatus& status) {
-    status = kExitSuccess;
     const std::vector<PartPaths> recordings = joinedParts(_options.recordings, Recording::open);
-    if (recordings.size() > kMostRecordings) {
-        _environment.report(
-            "report takes one recording, or two to compare (see pallax report --help)");
+    if (const char* refusal = refusalOf(recordings.size(), _options)) {
+        _environment.report(refusal);
         status = kExitWrongUsage;
         return std::nullopt;
     }
+    status = kExitSuccess;
     const auto track = trackData(status);
     if (!track) {
         return std::nullopt;
@@ -111,12 +131,16 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
     }
     Timeline& timeline = (*recorded)->timeline();
     const std::string name = shownName(paths);
-    ReportBuilder report(_environment.names, _environment.profile);
+    const RecordedTechnology& technology = *technologyOfCommandName(timeline.fields().technology());
+    const IsLeftOut isLeftOut = _options.withIdentities
+                                    ? IsLeftOut()
+                                    : leftOutOf(technology, _environment.decoder.resources);
+    ReportBuilder report(_environment.names, _environment.profile, isLeftOut);
     std::vector<Event> events;
     if (!gather(timeline, name, report, events, status)) {
         return std::nullopt;
     }
-    ReportHead head = headOf(paths, timeline);
+    ReportHead head = headOf(paths, place, timeline);
     head.notes = (*recorded)->notes();
     for (const std::string& note : head.notes) {
         _environment.report(note);
@@ -184,10 +208,12 @@ bool ReportCommand::gather(Timeline& timeline, const std::string& name, ReportBu
     return true;
 }
 
-ReportHead ReportCommand::headOf(const PartPaths& paths, const Timeline& timeline) const {
+ReportHead ReportCommand::headOf(const PartPaths& paths, std::size_t place,
+                                 const Timeline& timeline) const {
     const RecordedTechnology& technology = *technologyOfCommandName(timeline.fields().technology());
     return {
         .title = _options.title,
+        .label = place < _options.labels.size() ? _options.labels[place] : "",
         .recording = shownName(paths),
         .technology =
             std::string(gatherReference(technology, _environment.decoder.resources).title),

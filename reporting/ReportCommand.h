@@ -35,6 +35,7 @@ struct ReportOptions {
     std::optional<TimeText> to = {};
     std::optional<std::string> where = {}; ///< only the ticks for which it holds
     std::string title = {};
+    std::vector<std::string> labels = {}; ///< of the devices, in the order of the recordings
     bool withIdentities = false;
     std::string track = {}; ///< a GPX file
 };
@@ -71,7 +72,7 @@ private:
     /// False after a complaint about the options.
     bool gather(Timeline& timeline, const std::string& name, ReportBuilder& report,
                 std::vector<struct Event>& events, ExitStatus& status);
-    ReportHead headOf(const PartPaths& paths, const Timeline& timeline) const;
+    ReportHead headOf(const PartPaths& paths, std::size_t place, const Timeline& timeline) const;
     std::optional<std::string> trackData(ExitStatus& status) const;
 
     const ReportOptions& _options;

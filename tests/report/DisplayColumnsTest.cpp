@@ -108,5 +108,19 @@ TEST(DisplayColumns, AgreeWithAnyDisplays) {
     }));
 }
 
+TEST(DisplayColumns, SaysWhatIsLeftOut) {
+    DisplayColumns columns(
+        [](const std::vector<std::string>& path) { return path.back() == "ICCID"; });
+    columns.add(0, Dictionary{{"SIM", Dictionary{{"ICCID", "000"}, {"Slot", "000"}}}});
+    columns.add(1, Dictionary{{"SIM", Dictionary{{"Slot", "000"}}}});
+    ASSERT_EQ(columns.columns().size(), 2U);
+    const auto& iccid = *columns.columns()[0];
+    EXPECT_EQ(iccid.path, (std::vector<std::string>{"SIM", "ICCID"}));
+    ASSERT_EQ(iccid.changes.size(), 2U);
+    EXPECT_EQ(columns.texts()[iccid.changes[0].text], "left out");
+    EXPECT_EQ(iccid.changes[1].text, 0U) << "nothing is shown there any more";
+    EXPECT_EQ(columns.texts()[columns.columns()[1]->changes[0].text], "000");
+}
+
 } // namespace
 } // namespace pallax
