@@ -35,12 +35,14 @@ void addPoint(const pugi::xml_node& node, Track& track) {
     TrackPoint point;
     point.latitude = node.attribute("lat").as_double(NAN);
     point.longitude = node.attribute("lon").as_double(NAN);
+    const bool isPlace =
+        std::abs(point.latitude) <= kMostLatitude && std::abs(point.longitude) <= kMostLongitude;
     for (const pugi::xml_node& child : node.children()) {
-        const auto time =
-            localName(child.name()) == "time" ? timeIn(child.text().get()) : std::nullopt;
-        const bool isPlace = std::abs(point.latitude) <= kMostLatitude &&
-                             std::abs(point.longitude) <= kMostLongitude;
-        if (time && isPlace && *time >= kEarliestTime && *time <= kLatestTime) {
+        if (!isPlace || localName(child.name()) != "time") {
+            continue;
+        }
+        const auto time = timeIn(child.text().get());
+        if (time && *time >= kEarliestTime && *time <= kLatestTime) {
             point.time = *time;
             track.push_back(point);
             return;
