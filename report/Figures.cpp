@@ -301,22 +301,22 @@ Array lanesOf(const std::map<std::string, SpanLane>& lanes) {
     return objects;
 }
 
-/// The words of an event without the name of a context, which identifies a person.
+/// The words of an event without the name of a context.
 std::string wordsWithoutName(const Event& event) {
     const bool hasName = event.kind == EventKind::ContextUp || event.kind == EventKind::ContextDown;
     return hasName ? event.words.substr(0, event.words.find(": ")) : event.words;
 }
 
 Array eventObjects(const ReportHead& head, const ReportBuilder& report,
-                   const std::vector<Event>& events) {
+                   const std::vector<Event>& events, const FieldTable& fields) {
+    const bool hasNames = head.hasIdentities || !ReportBuilder::areContextsPersonal(fields);
     Array objects;
     for (const Event& event : events) {
-        objects.emplace_back(
-            Dictionary{{"time", number(pageSeconds(event.time))},
-                       {"packet", count(event.packet)},
-                       {"kind", std::string(wordOf(event.kind))},
-                       {"words", head.hasIdentities ? event.words : wordsWithoutName(event)},
-                       {"stretch", count(stretchOf(report, event.packet))}});
+        objects.emplace_back(Dictionary{{"time", number(pageSeconds(event.time))},
+                                        {"packet", count(event.packet)},
+                                        {"kind", std::string(wordOf(event.kind))},
+                                        {"words", hasNames ? event.words : wordsWithoutName(event)},
+                                        {"stretch", count(stretchOf(report, event.packet))}});
     }
     return objects;
 }
@@ -337,7 +337,7 @@ Dictionary figuresOf(const ReportHead& head, const ReportBuilder& report,
         {"neighbours", neighboursOf(report)},
         {"states", lanesOf(report.states())},
         {"contexts", lanesOf(report.contexts())},
-        {"events", eventObjects(head, report, events)},
+        {"events", eventObjects(head, report, events, fields)},
     };
 }
 

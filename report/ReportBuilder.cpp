@@ -1,6 +1,7 @@
 #include "report/ReportBuilder.h"
 
 #include "fields/CellFields.h"
+#include "fields/EventFields.h"
 #include "fields/Measures.h"
 #include "monitor/TickGrid.h"
 #include "overview/StatusWords.h"
@@ -100,6 +101,16 @@ std::string_view systemName(RadioSystem system, std::string_view technology) {
 
 } // namespace
 
+bool ReportBuilder::areContextsPersonal(const FieldTable& fields) {
+    const auto rules = eventFields();
+    return std::any_of(rules.begin(), rules.end(), [&fields](const EventFields& rule) {
+        const bool isContext =
+            rule.technology == fields.technology() && rule.watch == EventFields::Watch::Contexts;
+        const auto field = isContext ? fields.named(rule.fields.front()) : std::nullopt;
+        return field && fields[*field].isPersonal;
+    });
+}
+
 bool ReportBuilder::isKnown(const StatusValue& level, Time at) const {
     return std::isfinite(level.number) && at - level.read <= kKnownFor;
 }
@@ -127,7 +138,8 @@ void ReportBuilder::take(const ReportTick& tick) {
             measure.worst.restart();
         }
     }
-    _pending = {tick.time, std::move(status), detectedIn(tick.values)};
+    const bool hasContextNames = !_isMasked || !areContextsPersonal(tick.values.fields());
+    _pending = {tick.time, std::move(status), hasContextNames, detectedIn(tick.values)};
 }
 
 void ReportBuilder::finish() {
@@ -197,10 +209,11 @@ void ReportBuilder::settleLanes(Time until) {
 void ReportBuilder::settleContexts(Time until) {
     std::set<std::string> active;
     for (const StatusContext& context : _pending->status.contexts) {
-        const std::string name =
-            _hasContextNames ? context.name : "context " + std::to_string(active.size() + 1);
+        const std::string name = _pending->hasContextNames
+                                     ? context.name
+                                     : "context " + std::to_string(active.size() + 1);
         if (_contexts.size() < kMostNeighbours || _contexts.contains(name)) {
-            const bool isTold = _hasContextNames && !context.state.empty();
+            const bool isTold = _pending->hasContextNames && !context.state.empty();
             _contexts[name].add(
                 {_pending->time, until, isTold ? context.state : "there", stretch()});
             active.insert(name);

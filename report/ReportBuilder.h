@@ -83,11 +83,13 @@ public:
     static constexpr std::size_t kMostNeighbours = 512;
     static constexpr std::size_t kMostStays = 65536;
 
-    /// `names` and `profile` must outlive the builder. `isLeftOut` is empty if nothing is masked;
-    /// otherwise contexts have no names.
+    /// Whether the names of contexts identify a person, so that they are masked.
+    static bool areContextsPersonal(const FieldTable& fields);
+
+    /// `names` and `profile` must outlive the builder. `isLeftOut` is empty if nothing is masked.
     ReportBuilder(const NetworkNames& names, const QualityProfile& profile,
                   const IsLeftOut& isLeftOut = {})
-        : _names(names), _profile(profile), _hasContextNames(!isLeftOut), _display(isLeftOut) {}
+        : _names(names), _profile(profile), _isMasked(isLeftOut), _display(isLeftOut) {}
 
     /// Ticks come in their order.
     void take(const ReportTick& tick);
@@ -113,6 +115,7 @@ private:
     struct Pending {
         Time time;
         Status status;
+        bool hasContextNames;
         std::set<std::pair<std::string, std::string>> detected; ///< system and cell
     };
 
@@ -133,7 +136,7 @@ private:
 
     const NetworkNames& _names;
     const QualityProfile& _profile;
-    bool _hasContextNames;
+    bool _isMasked;
     std::vector<Time> _ticks;
     std::vector<ReportStretch> _stretches;
     std::optional<Pending> _pending;

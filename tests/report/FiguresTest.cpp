@@ -116,26 +116,28 @@ TEST(Figures, TellOfWhichStretchOfTimeSomethingIs) {
               R"("kind":"time-step","words":"of the second stretch","stretch":1}])");
 }
 
-TEST(Figures, NameAContextOnlyWithIdentities) {
+TEST(Figures, NameAContextIfThatIdentifiesNobody) {
     const NetworkNames names;
     const QualityProfile profile = *builtInProfile(kDefaultProfile);
-    ReportBuilder report(names, profile);
-    ValuesFixture values("lte");
-    report.take({ValuesFixture::at(0), values.values, PropertyList()});
-    report.finish();
     const std::vector<Event> events{
         {EventKind::ContextUp, ValuesFixture::at(0), 1, "context up: internet", {}},
         {EventKind::ContextDown, ValuesFixture::at(0), 1, "context down: a: b", {}}};
-    const auto words = [&](bool hasIdentities) {
+    const auto words = [&](const char* technology, bool hasIdentities) {
+        ReportBuilder report(names, profile);
+        const ValuesFixture values(technology);
+        report.take({ValuesFixture::at(0), values.values, PropertyList()});
+        report.finish();
         const ReportHead head{
             .recording = "", .technology = "", .version = "", .hasIdentities = hasIdentities};
         return json(figuresOf(head, report, events, values.fields), "events");
     };
-    EXPECT_EQ(words(false),
+    EXPECT_EQ(words("lte", false),
               R"([{"time":1700000000,"packet":1,"kind":"context-up","words":"context up",)"
               R"("stretch":0},{"time":1700000000,"packet":1,"kind":"context-down",)"
               R"("words":"context down","stretch":0}])");
-    EXPECT_NE(words(true).find("context down: a: b"), std::string::npos);
+    EXPECT_NE(words("lte", true).find("context down: a: b"), std::string::npos);
+    EXPECT_NE(words("ifx", false).find("context down: a: b"), std::string::npos)
+        << "the mask keeps the access points of its connections";
 }
 
 } // namespace

@@ -14,13 +14,14 @@ export interface Distribution {
     bins: Bin[];
 }
 
-/** Every reading of a measure: no more points than a day has ticks. */
-export function allOf(model: Model, measure: Measure): Promise<Drawn> {
-    return model.source.series([measure.id], -Infinity, Infinity, 2_000_000);
+/** Every reading of a measure, in each stretch: no more points than a day has ticks. */
+export function allOf(model: Model, measure: Measure): Promise<Drawn[]> {
+    const stretches = model.source.isLive ? [model.stretch] : model.figures.head.stretches.map((_, i) => i);
+    return Promise.all(stretches.map((stretch) => model.source.series([measure.id], -Infinity, Infinity, 2_000_000, stretch)));
 }
 
-export function distributionOf(drawn: Drawn, values: (number | null)[], label: string): Distribution {
-    return { label, bins: histogramOf(drawn.times, values, hole) };
+export function distributionOf(pieces: readonly Drawn[], label: string): Distribution {
+    return { label, bins: histogramOf(pieces, hole) };
 }
 
 /** Histograms as bars, cumulative curves as lines; several lie over each other. */
@@ -87,9 +88,10 @@ export function distributionView(model: Model): HTMLElement {
     const draw = async (): Promise<void> => {
         const { measures, cells } = model.figures;
         const charts = await Promise.all(measures.map(async (measure) => {
-            const drawn = await allOf(model, measure);
-            const values = choice.value ? inCell(drawn, 0, cells, choice.value) : drawn.values[0]!;
-            return distributionChart(measureName(measure, measures), measure.unit, [distributionOf(drawn, values, '')]);
+            const all = await allOf(model, measure);
+            const pieces = choice.value === '' ? all
+                : all.map((piece, i) => inCell(piece, cells.filter((stay) => model.source.isLive || stay.stretch === i), choice.value));
+            return distributionChart(measureName(measure, measures), measure.unit, [distributionOf(pieces, '')]);
         }));
         place.replaceChildren(...charts);
     };
