@@ -7,6 +7,7 @@
 #include "host/Files.h"
 #include "masking/MaskPlan.h"
 #include "masking/MaskedJournal.h"
+#include "monitor/TickGrid.h"
 #include "platform/Bundle.h"
 #include "platform/Clock.h"
 #include "query/Condition.h"
@@ -15,7 +16,6 @@
 #include "report/Page.h"
 #include "report/PageData.h"
 #include "report/ReportWalk.h"
-#include "report/Track.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -47,6 +47,15 @@ const char* refusalOf(std::size_t recordings, const ReportOptions& options) {
     return nullptr;
 }
 
+/// Whether the track has a point between the earliest and the latest tick.
+bool hasPointWithin(const Track& track, const std::vector<Time>& ticks) {
+    const auto [earliest, latest] = std::minmax_element(ticks.begin(), ticks.end());
+    return std::any_of(track.begin(), track.end(),
+                       [first = *earliest, last = *latest](const TrackPoint& point) {
+                           return point.time >= first - TickGrid::kInterval && point.time <= last;
+                       });
+}
+
 /// What the masked packets of a technology do not show.
 IsLeftOut leftOutOf(const RecordedTechnology& technology, const Resources& resources) {
     const auto plan = std::make_shared<MaskPlan>(technology, resources, MaskChoice());
@@ -76,12 +85,13 @@ std::optional<std::string> ReportCommand::make(ExitStatus& status) {
         return std::nullopt;
     }
     status = kExitSuccess;
-    const auto track = trackData(status);
+    const auto track = readTrack(status);
     if (!track) {
         return std::nullopt;
     }
-    std::string page = *track;
+    std::string page = track->empty() ? "" : pageTrack(*track);
     std::string json;
+    bool isOnTrack = track->empty();
     for (std::size_t place = 0; place < recordings.size(); ++place) {
         const auto part = makePart(recordings[place], place, status);
         if (!part) {
@@ -89,24 +99,32 @@ std::optional<std::string> ReportCommand::make(ExitStatus& status) {
         }
         page += part->page;
         json += part->json;
+        isOnTrack = isOnTrack || hasPointWithin(*track, part->ticks);
+    }
+    if (!isOnTrack) {
+        complainOfTrack("none of its points is in the time of the report", status);
+        return std::nullopt;
     }
     return _options.json ? json : pageHtml(page, PageUse::Report);
 }
 
-std::optional<std::string> ReportCommand::trackData(ExitStatus& status) const {
+std::optional<Track> ReportCommand::readTrack(ExitStatus& status) const {
     if (_options.track.empty()) {
-        return "";
+        return Track();
     }
     const auto content = readRegularFile(_options.track, kLargestTrack);
-    const auto track =
+    auto track =
         content ? parseTrack(*content) : Result<Track, std::string>(content.error().reason);
     if (!track) {
-        _environment.report(
-            formatText("%@ cannot be used as a track: %@.", {_options.track, track.error()}));
-        status = kExitFailure;
+        complainOfTrack(track.error(), status);
         return std::nullopt;
     }
-    return pageTrack(*track);
+    return std::move(track).value();
+}
+
+void ReportCommand::complainOfTrack(const std::string& reason, ExitStatus& status) const {
+    _environment.report(formatText("%@ cannot be used as a track: %@.", {_options.track, reason}));
+    status = kExitFailure;
 }
 
 std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& paths,
@@ -148,7 +166,7 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
     }
     status = timeline.hasEnded() ? kExitFatalRecord : status;
     const Dictionary figures = figuresOf(head, report, events, timeline.fields());
-    Part part;
+    Part part{.ticks = report.ticks()};
     if (_options.json) {
         appendJson(part.json, figures);
         part.json += '\n';

@@ -7,6 +7,7 @@
 #include "knowledge/Networks.h"
 #include "knowledge/Quality.h"
 #include "plist/PropertyList.h"
+#include "report/Track.h"
 #include "text/TimeText.h"
 
 #include <cstdint>
@@ -64,8 +65,9 @@ public:
 
 private:
     struct Part {
-        std::string page;
-        std::string json;
+        std::string page = {};
+        std::string json = {};
+        std::vector<Time> ticks;
     };
 
     std::optional<Part> makePart(const PartPaths& paths, std::size_t place, ExitStatus& status);
@@ -73,7 +75,9 @@ private:
     bool gather(Timeline& timeline, const std::string& name, ReportBuilder& report,
                 std::vector<struct Event>& events, ExitStatus& status);
     ReportHead headOf(const PartPaths& paths, std::size_t place, const Timeline& timeline) const;
-    std::optional<std::string> trackData(ExitStatus& status) const;
+    /// Empty without one. Nothing after a complaint.
+    std::optional<Track> readTrack(ExitStatus& status) const;
+    void complainOfTrack(const std::string& reason, ExitStatus& status) const;
 
     const ReportOptions& _options;
     const Environment& _environment;

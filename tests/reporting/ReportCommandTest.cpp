@@ -178,6 +178,20 @@ TEST_F(ReportCommandTest, DrawsATrack) {
                                                 " cannot be used as a track: it is no XML."});
 }
 
+TEST_F(ReportCommandTest, RefusesATrackOfAnotherTime) {
+    for (const char* time :
+         {"2023-11-13T22:13:22Z", "2023-11-14T22:13:17Z", "2023-11-14T22:15:21Z"}) {
+        options.track = file("way.gpx", std::string("<gpx><trk><trkseg><trkpt lat=\"50.5\" ") +
+                                            "lon=\"7.25\"><time>" + time +
+                                            "</time></trkpt></trkseg></trk></gpx>");
+        EXPECT_FALSE(make({sample("lte-drive.pcap")})) << time;
+        EXPECT_EQ(status, kExitFailure);
+        EXPECT_EQ(reports, std::vector<std::string>{options.track +
+                                                    " cannot be used as a track: none of its "
+                                                    "points is in the time of the report."});
+    }
+}
+
 TEST_F(ReportCommandTest, WhatCannotBeReadIsOneSentence) {
     EXPECT_FALSE(make({folder.file("none.pcap")}));
     EXPECT_EQ(status, kExitFailure);
