@@ -357,7 +357,7 @@ std::vector<std::string> ReportBuilder::notes() const {
         notes.emplace_back("Only the first 65,536 stays in a cell are in the report.");
     }
     if (_display.isFull()) {
-        notes.emplace_back("The values of the later part are left out: there are too many.");
+        notes.emplace_back("Some values are left out: there are too many.");
     }
     return notes;
 }

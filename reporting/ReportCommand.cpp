@@ -148,6 +148,14 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
         return std::nullopt;
     }
     Timeline& timeline = (*recorded)->timeline();
+    const std::vector<std::string> notes = (*recorded)->notes();
+    for (const std::string& note : notes) {
+        _environment.report(note);
+        status = kExitFailure;
+    }
+    if (timeline.packets() == 0 && !notes.empty()) {
+        return std::nullopt;
+    }
     const std::string name = shownName(paths);
     const RecordedTechnology& technology = *technologyOfCommandName(timeline.fields().technology());
     const IsLeftOut isLeftOut = _options.withIdentities
@@ -159,11 +167,7 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
         return std::nullopt;
     }
     ReportHead head = headOf(paths, place, timeline);
-    head.notes = (*recorded)->notes();
-    for (const std::string& note : head.notes) {
-        _environment.report(note);
-        status = kExitFailure;
-    }
+    head.notes = notes;
     status = timeline.hasEnded() ? kExitFatalRecord : status;
     const Dictionary figures = figuresOf(head, report, events, timeline.fields());
     Part part{.ticks = report.ticks()};

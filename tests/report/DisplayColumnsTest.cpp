@@ -4,6 +4,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <map>
 #include <string>
 
@@ -106,6 +107,27 @@ TEST(DisplayColumns, AgreeWithAnyDisplays) {
             RC_ASSERT(shown == expected[tick]);
         }
     }));
+}
+
+TEST(DisplayColumns, KeepsABoundedNumberOfPlaces) {
+    DisplayColumns columns;
+    std::size_t next = 0;
+    for (std::uint32_t tick = 0; tick < 100; ++tick) {
+        Dictionary display;
+        for (int count = 0; count < 200; ++count) {
+            display.set(std::to_string(next++), "x");
+        }
+        columns.add(tick, display);
+        EXPECT_EQ(columns.isFull(), next >= DisplayColumns::kMostPlaces);
+    }
+    EXPECT_EQ(columns.columns().size(), DisplayColumns::kMostPlaces);
+    columns.add(100, Dictionary{{"0", "y"}});
+    const auto all = columns.columns();
+    const auto known = std::find_if(all.begin(), all.end(), [](const auto* column) {
+        return column->path == std::vector<std::string>{"0"};
+    });
+    ASSERT_NE(known, all.end());
+    EXPECT_EQ(columns.texts()[(*known)->changes.back().text], "y") << "it goes on";
 }
 
 TEST(DisplayColumns, SaysWhatIsLeftOut) {

@@ -9,7 +9,7 @@ import type { Model } from '../model.js';
 import type { Border } from '../source.js';
 
 /** Beside the plots, so that lanes can stand below them. */
-export const gutter = { left: 72, right: 24 };
+export const gutter = { left: 72, right: 32 };
 const plotHeight = 150;
 
 export interface CurveOf {
