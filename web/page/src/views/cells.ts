@@ -38,14 +38,17 @@ function rowOf(model: Model, total: Total): Cell[] {
         button(clockText(longest.from), `Show the longest stay in ${total.stay.cell}`, () => model.goTo(longest.from, longest.to, longest.stretch))];
 }
 
+/** A browser takes long for more rows. */
+const mostRows = 500;
+
 /** The cells that served, with how long each stay was. */
 export function cellsView(model: Model): HTMLElement {
     const place = h('div');
     const draw = (): void => {
         const totals = totalsOf(model.figures.cells);
         place.replaceChildren(totals.length === 0 ? h('p', {}, 'No serving cell is known.')
-            : table('Serving cells, the longest first', ['Cell', 'What is known', '#Stays', '#Total', '#Median stay', '#Shortest',
-                '#Ping-pongs', 'Longest stay'], totals.map((total) => rowOf(model, total))));
+            : table(totals.length > mostRows ? `The ${mostRows} longest of ${totals.length} serving cells` : 'Serving cells, the longest first', ['Cell', 'What is known', '#Stays', '#Total', '#Median stay', '#Shortest',
+                '#Ping-pongs', 'Longest stay'], totals.slice(0, mostRows).map((total) => rowOf(model, total))));
     };
     draw();
     model.on('data', draw);

@@ -8,6 +8,8 @@ import type { Drawn, Measure } from '../source.js';
 
 const [width, height, left, bottom] = [460, 200, 40, 28];
 
+const byNumber = new Intl.Collator('en', { numeric: true });
+
 /** One recording's values of a measure. */
 export interface Distribution {
     label: string;
@@ -79,7 +81,7 @@ export function distributionView(model: Model): HTMLElement {
     const choice = h('select', { 'aria-label': 'Cell' });
     const place = h('div', { class: 'small-charts' });
     const fill = (): void => {
-        const cells = [...new Set(model.figures.cells.map((stay) => stay.cell))].sort((a, b) => a.localeCompare(b, 'en', { numeric: true }));
+        const cells = [...new Set(model.figures.cells.map((stay) => stay.cell))].sort(byNumber.compare);
         const chosen = choice.value;
         choice.replaceChildren(h('option', { value: '' }, `all cells (${counted(cells.length, 'cell')})`),
             ...cells.map((cell) => h('option', { value: cell }, cell)));
