@@ -70,9 +70,12 @@ values that were not exceeded for 5, 50 and 95 % of it, and the worst minute
 (the least mean) follow from that. A level that was read more than 10 s ago is
 not known any more. Events are those of pallax events.
 
-What identifies a person is left out as by pallax mask, with zeros in its place;
-the page says so, or that --with-identities was given. Identities of cells stay.
-Of a path, only the name of the file is shown.
+What identifies a person is left out: the fields that pallax mask masks. The
+page says so where it was, or that --with-identities was given. Identities of
+cells stay. Of a path, only the name of the file is shown. --label names the
+device; of two recordings, the first --label is for the first.
+
+Where the clock was set back, the page shows each stretch of time by itself.
 
 --where takes a condition as pallax decode does; the report then has only the
 ticks for which it holds. --track draws the way that a GPX file describes,
@@ -145,6 +148,9 @@ void addReport(CLI::App& app, ReportOptions& options) {
     app.add_option("--where", options.where, "Only the display ticks for which this holds")
         ->type_name("CONDITION");
     app.add_option("--title", options.title, "The title of the page")->type_name("TEXT");
+    app.add_option("--label", options.labels, "What the device is called, once for each recording")
+        ->type_name("TEXT")
+        ->allow_extra_args(false);
     app.add_option("--track", options.track, "Draw the way in this GPX file")->type_name("FILE");
     app.add_flag("--with-identities", options.withIdentities,
                  "Keep what identifies a person, and say so");

@@ -4,11 +4,32 @@
 #include <cstdio>
 #include <cstdlib>
 #include <fcntl.h>
+#include <filesystem>
+#include <sys/stat.h>
+#include <system_error>
 #include <unistd.h>
 
 namespace pallax {
 
-std::unique_ptr<NewFile> NewFile::create(const std::string& path) {
+namespace {
+
+bool isDeviceOrPipe(const std::string& path) {
+    struct stat status {};
+    return ::stat(path.c_str(), &status) == 0 && !S_ISREG(status.st_mode) &&
+           !S_ISDIR(status.st_mode);
+}
+
+} // namespace
+
+std::unique_ptr<NewFile> NewFile::create(const std::string& name) {
+    if (isDeviceOrPipe(name)) {
+        Descriptor device(::open(name.c_str(), O_WRONLY | O_CLOEXEC | O_NOCTTY));
+        return device ? std::unique_ptr<NewFile>(new NewFile(name, "", std::move(device)))
+                      : nullptr;
+    }
+    std::error_code isNew;
+    const auto target = std::filesystem::canonical(name, isNew);
+    const std::string path = isNew ? name : target.string();
     std::string temporary = path + ".XXXXXX";
     Descriptor file(::mkostemp(temporary.data(), O_CLOEXEC)); // with mode 0600
     if (!file) {
@@ -39,6 +60,9 @@ bool NewFile::write(Bytes bytes) {
 }
 
 bool NewFile::finish() {
+    if (_temporary.empty()) {
+        return true;
+    }
     if (::fsync(_file.number()) != 0 || std::rename(_temporary.c_str(), _path.c_str()) != 0) {
         return false;
     }

@@ -288,6 +288,12 @@ std::vector<FoundIdentity> findIdentities(Bytes bytes) {
 }
 
 bool hasIdentity(std::string_view text) {
+    const auto digits = std::count_if(text.begin(), text.end(), [](char letter) {
+        return isDigit(static_cast<std::uint8_t>(letter));
+    });
+    if (digits < static_cast<std::ptrdiff_t>(kFewestPhoneDigits)) {
+        return false; // all kinds have more
+    }
     std::vector<FoundIdentity> found;
     findLetters(Bytes(reinterpret_cast<const std::uint8_t*>(text.data()), text.size()), // NOLINT
                 1, found);

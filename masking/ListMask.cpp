@@ -8,8 +8,9 @@
 
 #include <algorithm>
 #include <charconv>
-#include <map>
 #include <span>
+#include <utility>
+#include <vector>
 
 namespace pallax {
 
@@ -290,14 +291,17 @@ private:
 class Sharing {
 public:
     void add(const ScalarPlace& place, MaskAction action) {
-        const auto [known, isNew] = _actions.emplace(place.content.offset, action);
-        _isMixed = _isMixed || (!isNew && known->second != action);
+        _uses.emplace_back(place.content.offset, action);
     }
-    bool isMixed() const { return _isMixed; }
+    bool isMixed() {
+        std::sort(_uses.begin(), _uses.end());
+        return std::adjacent_find(_uses.begin(), _uses.end(), [](const auto& a, const auto& b) {
+                   return a.first == b.first && a.second != b.second;
+               }) != _uses.end();
+    }
 
 private:
-    std::map<std::size_t, MaskAction> _actions;
-    bool _isMixed = false;
+    std::vector<std::pair<std::size_t, MaskAction>> _uses;
 };
 
 } // namespace
@@ -337,12 +341,16 @@ ListMaskResult maskList(ByteBuffer& list, const ScalarRule& rule, const Replacem
     return ListMaskResult::Masked;
 }
 
-MaskAction ofLooseValue(const ScalarPath& path, const PropertyList& value) {
+bool looksPersonal(const PropertyList& value) {
     const SharedBytes data = value.data();
-    const bool isFound =
-        data != nullptr ? !findIdentities(*data).empty() : hasIdentity(value.string().value_or(""));
-    return isFound || std::any_of(path.begin(), path.end(), isPersonalKey) ? MaskAction::Mask
-                                                                           : MaskAction::Keep;
+    return data != nullptr ? !findIdentities(*data).empty()
+                           : hasIdentity(value.string().value_or(""));
+}
+
+MaskAction ofLooseValue(const ScalarPath& path, const PropertyList& value) {
+    const bool isPersonal =
+        looksPersonal(value) || std::any_of(path.begin(), path.end(), isPersonalKey);
+    return isPersonal ? MaskAction::Mask : MaskAction::Keep;
 }
 
 } // namespace pallax

@@ -25,6 +25,9 @@ enum class ListMaskResult {
 ListMaskResult maskList(ByteBuffer& list, const ScalarRule& rule, const Replacement& replacement,
                         const Replacement& places);
 
+/// Whether a text looks like an identity, or data hold one.
+bool looksPersonal(const PropertyList& value);
+
 /// What to do with a value whose keys are in no layout, as in an object stream: masked if a key
 /// names an identity, or if its text looks like one.
 MaskAction ofLooseValue(const ScalarPath& path, const PropertyList& value);

@@ -7,6 +7,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <unordered_set>
 #include <vector>
 
 namespace pallax {
@@ -43,6 +44,8 @@ public:
     /// How the sections read records of that code; empty if none does.
     const std::vector<const CodeDescription*>& codes(LogCode code) const;
     MaskAction of(FieldId row) const;
+    /// Whether any field of the code is to be replaced.
+    bool masks(const CodeDescription& code) const { return _masked.contains(&code); }
     /// The name of the field of a row.
     const std::string& nameOf(FieldId row) const;
 
@@ -70,11 +73,14 @@ private:
     };
 
     MaskAction actionOf(const FieldInfo& field, const MaskChoice& choice) const;
+    template <class Described>
+    bool masksIn(const Described& parts) const; ///< fields, and lists of them
 
     TechnologyReference _reference;
     FieldRegistry _registry;
     std::map<LogCode, std::vector<const CodeDescription*>> _byCode;
     std::map<FieldId, Row> _rows;
+    std::unordered_set<const CodeDescription*> _masked;
     std::vector<Shown> _shown;
     bool _keepsUnknown;
 };

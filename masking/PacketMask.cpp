@@ -155,6 +155,9 @@ void PacketMask::mask(ByteBuffer& packet, MaskReport& report) const {
     std::vector<std::pair<Position, std::uint64_t>> numbers;
     const Bytes record = LogPacketRecord(packet);
     for (const CodeDescription* code : reading.readers) {
+        if (!_plan.masks(*code)) {
+            continue;
+        }
         for (const Edit& edit : Places(_plan, packet, LogRecord(record)).of(*code)) {
             const auto number = static_cast<std::uint64_t>(LogRecord(packet).read(edit.position));
             numbers.emplace_back(edit.position, replaced(number, edit, _replacements));
@@ -196,8 +199,8 @@ void PacketMask::find(const ByteBuffer& packet, const IdentityVisitor& visit) co
 MaskAction PacketMask::actionIn(const Reading& reading, const ScalarPath& path,
                                 const PropertyList& value) const {
     if (reading.readers.empty()) {
-        const MaskAction action = _plan.ofDisplay(path);
-        return action == MaskAction::Keep ? ofLooseValue(path, value) : action;
+        const MaskAction action = _byPath.of(path);
+        return action == MaskAction::Keep && looksPersonal(value) ? MaskAction::Mask : action;
     }
     MaskAction action = MaskAction::Keep;
     for (const CodeDescription* code : reading.readers) {

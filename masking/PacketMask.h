@@ -2,6 +2,7 @@
 
 #include "masking/MaskPlan.h"
 #include "masking/MaskReport.h"
+#include "masking/PathActions.h"
 #include "masking/Replacement.h"
 #include "text/Bytes.h"
 
@@ -17,12 +18,12 @@ struct Replacements {
     Replacement places;     ///< keyed
 };
 
-/// Masks the packets of one technology.
+/// Masks the packets of one technology. Not for several threads.
 class PacketMask {
 public:
     /// Both must outlive it.
     PacketMask(const MaskPlan& plan, const Replacements& replacements)
-        : _plan(plan), _replacements(replacements) {}
+        : _plan(plan), _replacements(replacements), _byPath(plan) {}
 
     /// Masks a packet in its bytes and counts what it does. The length stays, except where
     /// `maskList` writes a property list anew.
@@ -49,6 +50,7 @@ private:
 
     const MaskPlan& _plan;
     const Replacements& _replacements;
+    PathActions _byPath;
 };
 
 } // namespace pallax

@@ -4,6 +4,7 @@
 #include "text/Base64.h"
 
 #include <algorithm>
+#include <map>
 #include <utility>
 
 namespace pallax {
@@ -12,10 +13,12 @@ namespace pallax {
 struct DisplayColumns::Node {
     std::string key;
     Column column = {};
-    std::uint32_t text = 0;                           ///< that is shown now
-    bool isShown = false;                             ///< it, or something below it
-    std::uint32_t seen = 0;                           ///< the latest tick that showed it, plus 1
-    std::vector<std::unique_ptr<Node>> children = {}; ///< in the order of the display
+    std::uint32_t text = 0;                            ///< that is shown now
+    bool isLeftOut = false;                            ///< its text, if it is a leaf
+    bool isShown = false;                              ///< it, or something below it
+    std::uint32_t seen = 0;                            ///< the latest tick that showed it, plus 1
+    std::vector<std::unique_ptr<Node>> children = {};  ///< in the order of the display
+    std::multimap<std::string_view, Node*> byKey = {}; ///< the children
 };
 
 namespace {
@@ -27,7 +30,8 @@ std::string textOf(const PropertyList& leaf) {
 
 } // namespace
 
-DisplayColumns::DisplayColumns() : _root(std::make_unique<Node>()), _texts{{}} {}
+DisplayColumns::DisplayColumns(IsLeftOut isLeftOut)
+    : _isLeftOut(std::move(isLeftOut)), _root(std::make_unique<Node>()), _texts{{}} {}
 
 DisplayColumns::~DisplayColumns() = default;
 
@@ -40,21 +44,25 @@ void DisplayColumns::take(Node& node, const PropertyList& value) {
     node.seen = _tick + 1;
     node.isShown = true;
     std::size_t place = 0;
+    const auto takeNext = [&](std::string_view key, const PropertyList& each) {
+        if (Node* child = childOf(node, place, key)) {
+            take(*child, each);
+        }
+        ++place;
+    };
     if (const DictionaryRef dictionary = value.dictionary()) {
         for (const ShownEntry& entry : shownEntries(*dictionary)) {
-            take(childOf(node, place, entry.name), *entry.value);
-            ++place;
+            takeNext(entry.name, *entry.value);
         }
     } else if (const ArrayRef array = value.array()) {
         for (const PropertyList& element : *array) {
             if (!element.isNull()) {
-                take(childOf(node, place, std::to_string(place)), element);
-                ++place;
+                takeNext(std::to_string(place), element);
             }
         }
     }
     const bool isLeaf = !value.dictionary() && !value.array() && !value.isNull();
-    change(node, isLeaf ? numberOf(textOf(value)) : 0);
+    change(node, isLeaf ? numberOf(node.isLeftOut ? std::string(kLeftOut) : textOf(value)) : 0);
     for (const auto& child : node.children) {
         if (child->isShown && child->seen != _tick + 1) {
             leave(*child);
@@ -62,26 +70,36 @@ void DisplayColumns::take(Node& node, const PropertyList& value) {
     }
 }
 
-/// The child that should stand there: it seldom moves.
-DisplayColumns::Node& DisplayColumns::childOf(Node& node, std::size_t place, std::string_view key) {
-    auto& children = node.children;
-    const auto isFree = [&](const auto& child) { // several rows can have the same name
-        return child->key == key && child->seen != _tick + 1;
+/// The child that should stand there: it seldom moves. Null if there are too many.
+DisplayColumns::Node* DisplayColumns::childOf(Node& node, std::size_t place, std::string_view key) {
+    const auto isFree = [&](const Node& child) { // several rows can have the same name
+        return child.key == key && child.seen != _tick + 1;
     };
-    if (place < children.size() && isFree(children[place])) {
-        return *children[place];
+    if (place < node.children.size() && isFree(*node.children[place])) {
+        return node.children[place].get();
     }
-    const auto found = std::find_if(children.begin(), children.end(), isFree);
-    if (found != children.end()) {
-        return **found;
+    const auto [begin, end] = node.byKey.equal_range(key);
+    const auto found =
+        std::find_if(begin, end, [&](const auto& each) { return isFree(*each.second); });
+    return found != end ? found->second : addChild(node, key);
+}
+
+/// Stands after the one that was shown before it.
+DisplayColumns::Node* DisplayColumns::addChild(Node& node, std::string_view key) {
+    if (_places >= kMostPlaces) {
+        return nullptr;
     }
-    // A new one stands after the one that was shown before it.
-    auto after = std::find_if(children.rbegin(), children.rend(),
-                              [this](const auto& child) { return child->seen == _tick + 1; });
+    ++_places;
+    auto& children = node.children;
+    const auto after = std::find_if(children.rbegin(), children.rend(),
+                                    [this](const auto& child) { return child->seen == _tick + 1; });
     auto child = std::make_unique<Node>(Node{std::string(key)});
     child->column.path = node.column.path;
     child->column.path.emplace_back(key);
-    return **children.insert(after.base(), std::move(child));
+    child->isLeftOut = _isLeftOut && _isLeftOut(child->column.path);
+    Node* const added = children.insert(after.base(), std::move(child))->get();
+    node.byKey.emplace(added->key, added);
+    return added;
 }
 
 void DisplayColumns::leave(Node& node) {
@@ -95,7 +113,7 @@ void DisplayColumns::leave(Node& node) {
 }
 
 void DisplayColumns::change(Node& node, std::uint32_t text) {
-    if (node.text != text && !isFull()) {
+    if (node.text != text && _changes < kMostChanges) {
         node.text = text;
         node.column.changes.push_back({_tick, text});
         ++_changes;

@@ -83,11 +83,11 @@ Array stretchesOf(const ReportBuilder& report) {
     Array stretches;
     for (std::size_t index = 0; index < starts.size(); ++index) {
         const std::size_t end =
-            index + 1 < starts.size() ? starts[index + 1] : report.ticks().size();
-        stretches.emplace_back(
-            Dictionary{{"from", number(pageSeconds(report.ticks()[starts[index]]))},
-                       {"to", number(pageSeconds(report.ticks()[end - 1]))},
-                       {"ticks", count(end - starts[index])}});
+            index + 1 < starts.size() ? starts[index + 1].tick : report.ticks().size();
+        const std::size_t begin = starts[index].tick;
+        stretches.emplace_back(Dictionary{{"from", number(pageSeconds(report.ticks()[begin]))},
+                                          {"to", number(pageSeconds(report.ticks()[end - 1]))},
+                                          {"ticks", count(end - begin)}});
     }
     return stretches;
 }
@@ -101,6 +101,7 @@ Dictionary headObject(const ReportHead& head, const ReportBuilder& report,
     }
     return Dictionary{
         {"title", head.title},
+        {"label", head.label},
         {"recording", head.recording},
         {"technology", head.technology},
         {"operator", report.network() ? operatorWords(*report.network()) : ""},
@@ -155,7 +156,8 @@ PropertyList worstOf(const WorstMinute& worst) {
     return !found ? PropertyList()
                   : Dictionary{{"from", number(pageSeconds(found->from))},
                                {"to", number(pageSeconds(found->to))},
-                               {"mean", rounded(found->mean)}};
+                               {"mean", rounded(found->mean)},
+                               {"stretch", count(found->stretch)}};
 }
 
 /// The range of the axis: that of the measure, so that two drives look alike where they are alike.
@@ -194,46 +196,58 @@ Array measuresOf(const ReportBuilder& report) {
     return measures;
 }
 
-/// When a change within the tick that a stay began in happened, and whether it went back.
-struct Change {
-    Time time;
+/// The place of a packet's stretch of time among those of a report.
+std::uint32_t stretchOf(const ReportBuilder& report, std::uint64_t packet) {
+    std::uint32_t place = 0;
+    for (std::uint32_t index = 0; index < report.stretches().size(); ++index) {
+        place = report.stretches()[index].firstPacket <= packet ? index : place;
+    }
+    return place;
+}
+
+/// A change of the serving cell. `instant` is its stretch and its time: the clock can be set back.
+struct CellChange {
+    std::pair<std::uint32_t, Time> instant;
     bool isPingPong;
 };
 
-/// `changes` are changes of the cell.
-std::optional<Change> changeBefore(const std::vector<Event>& changes, Time tick) {
-    const auto past =
-        std::lower_bound(changes.begin(), changes.end(), tick,
-                         [](const Event& event, Time time) { return event.time < time; });
-    if (past == changes.begin() || (past - 1)->time < tick - TickGrid::kInterval) {
-        return std::nullopt;
+std::vector<CellChange> cellChanges(const ReportBuilder& report, const std::vector<Event>& events) {
+    std::vector<CellChange> changes;
+    for (const Event& event : events) {
+        if (event.kind == EventKind::CellChange || event.kind == EventKind::PingPong) {
+            changes.push_back(
+                {{stretchOf(report, event.packet), event.time}, event.kind == EventKind::PingPong});
+        }
     }
-    return Change{(past - 1)->time, (past - 1)->kind == EventKind::PingPong};
-}
-
-/// Changes of the cell, by time: the clock can have been set back.
-std::vector<Event> cellEvents(const std::vector<Event>& events) {
-    std::vector<Event> changes;
-    std::copy_if(events.begin(), events.end(), std::back_inserter(changes), [](const Event& each) {
-        return each.kind == EventKind::CellChange || each.kind == EventKind::PingPong;
+    std::stable_sort(changes.begin(), changes.end(), [](const auto& one, const auto& other) {
+        return one.instant < other.instant;
     });
-    std::stable_sort(changes.begin(), changes.end(),
-                     [](const Event& one, const Event& other) { return one.time < other.time; });
     return changes;
 }
 
+/// The change that a stay began with, within the tick that first showed it. Null if there is none.
+const CellChange* changeBefore(const std::vector<CellChange>& changes, const ReportStay& stay) {
+    const auto past = std::lower_bound(
+        changes.begin(), changes.end(), std::pair(stay.stretch, stay.from),
+        [](const CellChange& change, const auto& instant) { return change.instant < instant; });
+    const bool isNear = past != changes.begin() && (past - 1)->instant.first == stay.stretch &&
+                        (past - 1)->instant.second >= stay.from - TickGrid::kInterval;
+    return isNear ? &*(past - 1) : nullptr;
+}
+
 Array staysOf(const ReportBuilder& report, const std::vector<Event>& events) {
-    const std::vector<Event> changes = cellEvents(events);
+    const std::vector<CellChange> changes = cellChanges(report, events);
     Array stays;
     for (const ReportStay& stay : report.stays()) {
-        const auto change = changeBefore(changes, stay.from);
+        const CellChange* change = changeBefore(changes, stay);
         stays.emplace_back(Dictionary{
             {"system", stay.system},
             {"cell", stay.cell},
             {"details", textsOf(stay.details)},
-            {"from", number(pageSeconds(change ? change->time : stay.from))},
+            {"from", number(pageSeconds(change != nullptr ? change->instant.second : stay.from))},
             {"to", number(pageSeconds(stay.to))},
-            {"pingPong", PropertyList::boolean(change && change->isPingPong)},
+            {"stretch", count(stay.stretch)},
+            {"pingPong", PropertyList::boolean(change != nullptr && change->isPingPong)},
         });
     }
     return stays;
@@ -279,20 +293,30 @@ Array lanesOf(const std::map<std::string, SpanLane>& lanes) {
         for (const SpanLane::Span& span : lane.spans()) {
             spans.emplace_back(Dictionary{{"from", number(pageSeconds(span.from))},
                                           {"to", number(pageSeconds(span.to))},
-                                          {"text", span.text}});
+                                          {"text", span.text},
+                                          {"stretch", count(span.stretch)}});
         }
         objects.emplace_back(Dictionary{{"name", name}, {"spans", std::move(spans)}});
     }
     return objects;
 }
 
-Array eventObjects(const std::vector<Event>& events) {
+/// The words of an event without the name of a context.
+std::string wordsWithoutName(const Event& event) {
+    const bool hasName = event.kind == EventKind::ContextUp || event.kind == EventKind::ContextDown;
+    return hasName ? event.words.substr(0, event.words.find(": ")) : event.words;
+}
+
+Array eventObjects(const ReportHead& head, const ReportBuilder& report,
+                   const std::vector<Event>& events, const FieldTable& fields) {
+    const bool hasNames = head.hasIdentities || !ReportBuilder::areContextsPersonal(fields);
     Array objects;
     for (const Event& event : events) {
         objects.emplace_back(Dictionary{{"time", number(pageSeconds(event.time))},
                                         {"packet", count(event.packet)},
                                         {"kind", std::string(wordOf(event.kind))},
-                                        {"words", event.words}});
+                                        {"words", hasNames ? event.words : wordsWithoutName(event)},
+                                        {"stretch", count(stretchOf(report, event.packet))}});
     }
     return objects;
 }
@@ -313,7 +337,7 @@ Dictionary figuresOf(const ReportHead& head, const ReportBuilder& report,
         {"neighbours", neighboursOf(report)},
         {"states", lanesOf(report.states())},
         {"contexts", lanesOf(report.contexts())},
-        {"events", eventObjects(events)},
+        {"events", eventObjects(head, report, events, fields)},
     };
 }
 

@@ -12,7 +12,8 @@ namespace pallax {
 
 /// What a report says about itself.
 struct ReportHead {
-    std::string title;         ///< empty: that of the recording and its times
+    std::string title = {};    ///< empty: that of the recording and its times
+    std::string label = {};    ///< of the device, as its user calls it
     std::string recording;     ///< without its folder
     std::string technology;    ///< "LTE"
     std::string version;       ///< of this program

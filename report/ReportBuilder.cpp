@@ -1,6 +1,7 @@
 #include "report/ReportBuilder.h"
 
 #include "fields/CellFields.h"
+#include "fields/EventFields.h"
 #include "fields/Measures.h"
 #include "monitor/TickGrid.h"
 #include "overview/StatusWords.h"
@@ -100,6 +101,16 @@ std::string_view systemName(RadioSystem system, std::string_view technology) {
 
 } // namespace
 
+bool ReportBuilder::areContextsPersonal(const FieldTable& fields) {
+    const auto rules = eventFields();
+    return std::any_of(rules.begin(), rules.end(), [&fields](const EventFields& rule) {
+        const bool isContext =
+            rule.technology == fields.technology() && rule.watch == EventFields::Watch::Contexts;
+        const auto field = isContext ? fields.named(rule.fields.front()) : std::nullopt;
+        return field && fields[*field].isPersonal;
+    });
+}
+
 bool ReportBuilder::isKnown(const StatusValue& level, Time at) const {
     return std::isfinite(level.number) && at - level.read <= kKnownFor;
 }
@@ -112,7 +123,7 @@ void ReportBuilder::take(const ReportTick& tick) {
         settle(tick.isAfterStep ? latest : std::min(tick.time, latest));
     }
     if (isFirst || tick.time < _ticks.back()) {
-        _stretches.push_back(static_cast<std::uint32_t>(_ticks.size()));
+        _stretches.push_back({static_cast<std::uint32_t>(_ticks.size()), tick.firstPacket});
     }
     _ticks.push_back(tick.time);
     _display.add(this->tick(), tick.display);
@@ -127,7 +138,8 @@ void ReportBuilder::take(const ReportTick& tick) {
             measure.worst.restart();
         }
     }
-    _pending = {tick.time, std::move(status), detectedIn(tick.values)};
+    const bool hasContextNames = !_isMasked || !areContextsPersonal(tick.values.fields());
+    _pending = {tick.time, std::move(status), hasContextNames, detectedIn(tick.values)};
 }
 
 void ReportBuilder::finish() {
@@ -152,7 +164,7 @@ void ReportBuilder::settleLevels(double seconds) {
             if (isKnown(level, _pending->time)) {
                 ReportMeasure& measure = measureOf(cell, level);
                 measure.spread.add(level.number, seconds);
-                measure.worst.add(_pending->time, seconds, level.number);
+                measure.worst.add(_pending->time, seconds, level.number, stretch());
             }
         }
     }
@@ -186,23 +198,31 @@ void ReportBuilder::settleNeighbours(double seconds) {
 void ReportBuilder::settleLanes(Time until) {
     const Time from = _pending->time;
     for (const StatusValue& state : _pending->status.states) {
-        _states[state.name].add(from, until, state.text);
+        _states[state.name].add({from, until, state.text, stretch()});
     }
+    settleContexts(until);
+    for (auto& [system, place] : _current) {
+        _stays[place].to = until;
+    }
+}
+
+void ReportBuilder::settleContexts(Time until) {
     std::set<std::string> active;
     for (const StatusContext& context : _pending->status.contexts) {
-        if (_contexts.size() < kMostNeighbours || _contexts.contains(context.name)) {
-            _contexts[context.name].add(from, until,
-                                        context.state.empty() ? "there" : context.state);
-            active.insert(context.name);
+        const std::string name = _pending->hasContextNames
+                                     ? context.name
+                                     : "context " + std::to_string(active.size() + 1);
+        if (_contexts.size() < kMostNeighbours || _contexts.contains(name)) {
+            const bool isTold = _pending->hasContextNames && !context.state.empty();
+            _contexts[name].add(
+                {_pending->time, until, isTold ? context.state : "there", stretch()});
+            active.insert(name);
         }
     }
     for (auto& [name, lane] : _contexts) {
         if (!active.contains(name)) {
-            lane.add(from, until, "");
+            lane.add({_pending->time, until, "", stretch()});
         }
-    }
-    for (auto& [system, place] : _current) {
-        _stays[place].to = until;
     }
 }
 
@@ -253,7 +273,8 @@ void ReportBuilder::addStays(const Status& status, const ReportTick& tick) {
         noteServing(cell, tick.values.fields().technology(), current != _current.end());
         if (_stays.size() < kMostStays) {
             _current[cell.system] = _stays.size();
-            _stays.push_back({cell.system, words, detailsOf(cell), tick.time, tick.time});
+            _stays.push_back(
+                {cell.system, words, detailsOf(cell), tick.time, tick.time, stretch()});
         }
     }
 }
@@ -336,7 +357,7 @@ std::vector<std::string> ReportBuilder::notes() const {
         notes.emplace_back("Only the first 65,536 stays in a cell are in the report.");
     }
     if (_display.isFull()) {
-        notes.emplace_back("The values of the later part are left out: there are too many.");
+        notes.emplace_back("Some values are left out: there are too many.");
     }
     return notes;
 }

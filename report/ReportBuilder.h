@@ -26,6 +26,13 @@ struct ReportTick {
     /// The clock was set back before it, or time is missing: what held until the tick before is not
     /// known to hold until this one.
     bool isAfterStep = false;
+    std::uint64_t firstPacket = 0; ///< of its stretch of time
+};
+
+/// Times between two steps back of the clock.
+struct ReportStretch {
+    std::uint32_t tick;        ///< its first
+    std::uint64_t firstPacket; ///< of the recording's stretch
 };
 
 /// A level of the serving cell: "LTE RSRP". Each value stands for the time until the next tick.
@@ -63,6 +70,7 @@ struct ReportStay {
     std::vector<std::string> details; ///< "eNodeB 104466 sector 1", "EARFCN 1850", "band 3"
     Time from;
     Time to;
+    std::uint32_t stretch; ///< its place among the report's
 };
 
 /// Gathers what a report says, tick by tick, so that it can follow a live modem as well.
@@ -75,9 +83,13 @@ public:
     static constexpr std::size_t kMostNeighbours = 512;
     static constexpr std::size_t kMostStays = 65536;
 
-    /// All must outlive the builder.
-    ReportBuilder(const NetworkNames& names, const QualityProfile& profile)
-        : _names(names), _profile(profile) {}
+    /// Whether the names of contexts identify a person, so that they are masked.
+    static bool areContextsPersonal(const FieldTable& fields);
+
+    /// `names` and `profile` must outlive the builder. `isLeftOut` is empty if nothing is masked.
+    ReportBuilder(const NetworkNames& names, const QualityProfile& profile,
+                  const IsLeftOut& isLeftOut = {})
+        : _names(names), _profile(profile), _isMasked(isLeftOut), _display(isLeftOut) {}
 
     /// Ticks come in their order.
     void take(const ReportTick& tick);
@@ -87,8 +99,8 @@ public:
     const QualityProfile& profile() const { return _profile; }
     /// Of each tick, in their order.
     const std::vector<Time>& ticks() const { return _ticks; }
-    /// The places in `ticks` where a stretch of time begins.
-    const std::vector<std::uint32_t>& stretches() const { return _stretches; }
+    /// Several where the clock was set back.
+    const std::vector<ReportStretch>& stretches() const { return _stretches; }
     const std::optional<StatusOperator>& network() const { return _network; }
     const std::deque<ReportMeasure>& measures() const { return _measures; }
     const std::deque<ReportNeighbour>& neighbours() const { return _neighbours; }
@@ -103,6 +115,7 @@ private:
     struct Pending {
         Time time;
         Status status;
+        bool hasContextNames;
         std::set<std::pair<std::string, std::string>> detected; ///< system and cell
     };
 
@@ -110,6 +123,7 @@ private:
     void settleLevels(double seconds);
     void settleNeighbours(double seconds);
     void settleLanes(Time until);
+    void settleContexts(Time until);
     void addSeries(const Status& status);
     void addStays(const Status& status, const ReportTick& tick);
     void noteServing(const StatusCell& cell, std::string_view technology, bool isNew);
@@ -117,12 +131,14 @@ private:
     ReportMeasure& measureOf(const StatusCell& cell, const StatusValue& level);
     ReportNeighbour* neighbourOf(const std::string& system, const std::string& cell);
     bool isKnown(const StatusValue& level, Time at) const;
+    std::uint32_t stretch() const { return static_cast<std::uint32_t>(_stretches.size() - 1); }
     std::uint32_t tick() const { return static_cast<std::uint32_t>(_ticks.size() - 1); }
 
     const NetworkNames& _names;
     const QualityProfile& _profile;
+    bool _isMasked;
     std::vector<Time> _ticks;
-    std::vector<std::uint32_t> _stretches;
+    std::vector<ReportStretch> _stretches;
     std::optional<Pending> _pending;
     std::optional<StatusOperator> _network;
     std::deque<ReportMeasure> _measures;

@@ -7,6 +7,19 @@
 
 namespace pallax {
 
+namespace {
+
+/// The first packet of the stretch of time that a packet is in.
+std::uint64_t firstPacketAround(const Timeline& timeline, std::uint64_t packet) {
+    std::uint64_t first = 0;
+    for (const Stretch& stretch : timeline.stretches()) {
+        first = stretch.firstPacket <= packet ? stretch.firstPacket : first;
+    }
+    return first;
+}
+
+} // namespace
+
 void gatherTicks(Timeline& timeline, ReportBuilder& report,
                  const std::function<bool(const TickWalk::State& state)>& isWanted) {
     constexpr std::chrono::seconds kGap{60}; // as an event "gap"
@@ -23,7 +36,8 @@ void gatherTicks(Timeline& timeline, ReportBuilder& report,
         isAfterStep = isAfterStep || (before && (time < *before || time - *before > kGap));
         before = time;
         if (isWanted(state)) {
-            report.take({time, state.values, walk.display(), isAfterStep});
+            report.take({time, state.values, walk.display(), isAfterStep,
+                         firstPacketAround(timeline, state.packet)});
             isAfterStep = false;
         } else {
             isAfterStep = true; // it is not known to go on

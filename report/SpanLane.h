@@ -2,7 +2,9 @@
 
 #include "text/Date.h"
 
+#include <cstdint>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace pallax {
@@ -14,19 +16,20 @@ public:
         Time from;
         Time to;
         std::string text;
+        std::uint32_t stretch; ///< its place among the report's stretches of time
     };
     /// Further ones are left out, so that records of any content need a bounded memory.
     static constexpr std::size_t kMostSpans = 65536;
 
-    /// The text from a time until another one. Empty: there is none.
-    void add(Time from, Time to, const std::string& text) {
-        const bool goesOn = _isOpen && !_spans.empty() && _spans.back().text == text &&
-                            from >= _spans.back().from && from <= _spans.back().to;
-        _isOpen = !text.empty() && (goesOn || _spans.size() < kMostSpans);
+    /// An empty text: there is none.
+    void add(Span span) {
+        const bool goesOn = _isOpen && !_spans.empty() && _spans.back().text == span.text &&
+                            _spans.back().stretch == span.stretch && span.from <= _spans.back().to;
+        _isOpen = !span.text.empty() && (goesOn || _spans.size() < kMostSpans);
         if (_isOpen && goesOn) {
-            _spans.back().to = to;
+            _spans.back().to = span.to;
         } else if (_isOpen) {
-            _spans.push_back({from, to, text});
+            _spans.push_back(std::move(span));
         }
     }
     const std::vector<Span>& spans() const { return _spans; }

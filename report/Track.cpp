@@ -35,12 +35,10 @@ void addPoint(const pugi::xml_node& node, Track& track) {
     TrackPoint point;
     point.latitude = node.attribute("lat").as_double(NAN);
     point.longitude = node.attribute("lon").as_double(NAN);
-    if (!(std::abs(point.latitude) <= kMostLatitude && // also false for what is not a number
-          std::abs(point.longitude) <= kMostLongitude)) {
-        return;
-    }
+    const bool isPlace =
+        std::abs(point.latitude) <= kMostLatitude && std::abs(point.longitude) <= kMostLongitude;
     for (const pugi::xml_node& child : node.children()) {
-        if (localName(child.name()) != "time") {
+        if (!isPlace || localName(child.name()) != "time") {
             continue;
         }
         const auto time = timeIn(child.text().get());

@@ -15,7 +15,7 @@ Time endOf(Time from, double seconds) {
 
 } // namespace
 
-void WorstMinute::add(Time from, double seconds, double value) {
+void WorstMinute::add(Time from, double seconds, double value, std::uint32_t stretch) {
     _held.push_back({from, seconds, value});
     _seconds += seconds;
     _sum += seconds * value;
@@ -34,7 +34,7 @@ void WorstMinute::add(Time from, double seconds, double value) {
     const double mean = _sum / _seconds;
     const bool isWorse = !_found || (_isSmallerBetter ? mean > _found->mean : mean < _found->mean);
     if (isWorse) {
-        _found = {_held.front().from, end, mean};
+        _found = {_held.front().from, end, mean, stretch};
     }
 }
 

@@ -2,6 +2,7 @@
 
 #include "text/Date.h"
 
+#include <cstdint>
 #include <deque>
 #include <optional>
 
@@ -14,13 +15,14 @@ public:
         Time from;
         Time to;
         double mean;
+        std::uint32_t stretch; ///< its place among the report's stretches of time
     };
 
     explicit WorstMinute(bool isSmallerBetter = false) : _isSmallerBetter(isSmallerBetter) {}
 
     /// A value from a time on, which must not be before the earlier ones unless `restart` was
     /// called.
-    void add(Time from, double seconds, double value);
+    void add(Time from, double seconds, double value, std::uint32_t stretch);
     /// The clock has stepped: the next minute begins anew.
     void restart() { _held.clear(), _seconds = 0, _sum = 0; }
 

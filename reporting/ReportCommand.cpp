@@ -5,7 +5,9 @@
 #include "decoding/StateCondition.h"
 #include "fields/Reference.h"
 #include "host/Files.h"
+#include "masking/MaskPlan.h"
 #include "masking/MaskedJournal.h"
+#include "monitor/TickGrid.h"
 #include "platform/Bundle.h"
 #include "platform/Clock.h"
 #include "query/Condition.h"
@@ -14,7 +16,6 @@
 #include "report/Page.h"
 #include "report/PageData.h"
 #include "report/ReportWalk.h"
-#include "report/Track.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -35,6 +36,35 @@ std::string shownName(const PartPaths& paths) {
     return std::filesystem::path(isSeveral ? part->whole : paths.front()).filename().string();
 }
 
+/// Null if there is nothing wrong with the number of recordings.
+const char* refusalOf(std::size_t recordings, const ReportOptions& options) {
+    if (recordings > ReportCommand::kMostRecordings) {
+        return "report takes one recording, or two to compare (see pallax report --help)";
+    }
+    if (options.labels.size() > recordings) {
+        return "--label is for one recording each (see pallax report --help)";
+    }
+    return nullptr;
+}
+
+/// Whether the track has a point between the earliest and the latest tick.
+bool hasPointWithin(const Track& track, const std::vector<Time>& ticks) {
+    const auto [earliest, latest] = std::minmax_element(ticks.begin(), ticks.end());
+    return std::any_of(track.begin(), track.end(),
+                       [first = *earliest, last = *latest](const TrackPoint& point) {
+                           return point.time >= first - TickGrid::kInterval && point.time <= last;
+                       });
+}
+
+/// What the masked packets of a technology do not show.
+IsLeftOut leftOutOf(const RecordedTechnology& technology, const Resources& resources) {
+    const auto plan = std::make_shared<MaskPlan>(technology, resources, MaskChoice());
+    return [plan](const ScalarPath& path) {
+        return plan->ofDisplay(path) == MaskAction::Mask ||
+               (plan->areObjects() && std::any_of(path.begin(), path.end(), isPersonalKey));
+    };
+}
+
 TimeSpan spanOf(const Timeline& timeline) {
     TimeSpan span;
     for (const Stretch& stretch : timeline.stretches()) {
@@ -48,20 +78,20 @@ TimeSpan spanOf(const Timeline& timeline) {
 } // namespace
 
 std::optional<std::string> ReportCommand::make(ExitStatus& status) {
-    status = kExitSuccess;
     const std::vector<PartPaths> recordings = joinedParts(_options.recordings, Recording::open);
-    if (recordings.size() > kMostRecordings) {
-        _environment.report(
-            "report takes one recording, or two to compare (see pallax report --help)");
+    if (const char* refusal = refusalOf(recordings.size(), _options)) {
+        _environment.report(refusal);
         status = kExitWrongUsage;
         return std::nullopt;
     }
-    const auto track = trackData(status);
+    status = kExitSuccess;
+    const auto track = readTrack(status);
     if (!track) {
         return std::nullopt;
     }
-    std::string page = *track;
+    std::string page = track->empty() ? "" : pageTrack(*track);
     std::string json;
+    bool isOnTrack = track->empty();
     for (std::size_t place = 0; place < recordings.size(); ++place) {
         const auto part = makePart(recordings[place], place, status);
         if (!part) {
@@ -69,24 +99,32 @@ std::optional<std::string> ReportCommand::make(ExitStatus& status) {
         }
         page += part->page;
         json += part->json;
+        isOnTrack = isOnTrack || hasPointWithin(*track, part->ticks);
+    }
+    if (!isOnTrack) {
+        complainOfTrack("none of its points is in the time of the report", status);
+        return std::nullopt;
     }
     return _options.json ? json : pageHtml(page, PageUse::Report);
 }
 
-std::optional<std::string> ReportCommand::trackData(ExitStatus& status) const {
+std::optional<Track> ReportCommand::readTrack(ExitStatus& status) const {
     if (_options.track.empty()) {
-        return "";
+        return Track();
     }
     const auto content = readRegularFile(_options.track, kLargestTrack);
-    const auto track =
+    auto track =
         content ? parseTrack(*content) : Result<Track, std::string>(content.error().reason);
     if (!track) {
-        _environment.report(
-            formatText("%@ cannot be used as a track: %@.", {_options.track, track.error()}));
-        status = kExitFailure;
+        complainOfTrack(track.error(), status);
         return std::nullopt;
     }
-    return pageTrack(*track);
+    return std::move(track).value();
+}
+
+void ReportCommand::complainOfTrack(const std::string& reason, ExitStatus& status) const {
+    _environment.report(formatText("%@ cannot be used as a track: %@.", {_options.track, reason}));
+    status = kExitFailure;
 }
 
 std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& paths,
@@ -110,21 +148,29 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
         return std::nullopt;
     }
     Timeline& timeline = (*recorded)->timeline();
+    const std::vector<std::string> notes = (*recorded)->notes();
+    for (const std::string& note : notes) {
+        _environment.report(note);
+        status = kExitFailure;
+    }
+    if (timeline.packets() == 0 && !notes.empty()) {
+        return std::nullopt;
+    }
     const std::string name = shownName(paths);
-    ReportBuilder report(_environment.names, _environment.profile);
+    const RecordedTechnology& technology = *technologyOfCommandName(timeline.fields().technology());
+    const IsLeftOut isLeftOut = _options.withIdentities
+                                    ? IsLeftOut()
+                                    : leftOutOf(technology, _environment.decoder.resources);
+    ReportBuilder report(_environment.names, _environment.profile, isLeftOut);
     std::vector<Event> events;
     if (!gather(timeline, name, report, events, status)) {
         return std::nullopt;
     }
-    ReportHead head = headOf(paths, timeline);
-    head.notes = (*recorded)->notes();
-    for (const std::string& note : head.notes) {
-        _environment.report(note);
-        status = kExitFailure;
-    }
+    ReportHead head = headOf(paths, place, timeline);
+    head.notes = notes;
     status = timeline.hasEnded() ? kExitFatalRecord : status;
     const Dictionary figures = figuresOf(head, report, events, timeline.fields());
-    Part part;
+    Part part{.ticks = report.ticks()};
     if (_options.json) {
         appendJson(part.json, figures);
         part.json += '\n';
@@ -184,10 +230,12 @@ bool ReportCommand::gather(Timeline& timeline, const std::string& name, ReportBu
     return true;
 }
 
-ReportHead ReportCommand::headOf(const PartPaths& paths, const Timeline& timeline) const {
+ReportHead ReportCommand::headOf(const PartPaths& paths, std::size_t place,
+                                 const Timeline& timeline) const {
     const RecordedTechnology& technology = *technologyOfCommandName(timeline.fields().technology());
     return {
         .title = _options.title,
+        .label = place < _options.labels.size() ? _options.labels[place] : "",
         .recording = shownName(paths),
         .technology =
             std::string(gatherReference(technology, _environment.decoder.resources).title),

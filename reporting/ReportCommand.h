@@ -7,6 +7,7 @@
 #include "knowledge/Networks.h"
 #include "knowledge/Quality.h"
 #include "plist/PropertyList.h"
+#include "report/Track.h"
 #include "text/TimeText.h"
 
 #include <cstdint>
@@ -35,6 +36,7 @@ struct ReportOptions {
     std::optional<TimeText> to = {};
     std::optional<std::string> where = {}; ///< only the ticks for which it holds
     std::string title = {};
+    std::vector<std::string> labels = {}; ///< of the devices, in the order of the recordings
     bool withIdentities = false;
     std::string track = {}; ///< a GPX file
 };
@@ -63,16 +65,19 @@ public:
 
 private:
     struct Part {
-        std::string page;
-        std::string json;
+        std::string page = {};
+        std::string json = {};
+        std::vector<Time> ticks;
     };
 
     std::optional<Part> makePart(const PartPaths& paths, std::size_t place, ExitStatus& status);
     /// False after a complaint about the options.
     bool gather(Timeline& timeline, const std::string& name, ReportBuilder& report,
                 std::vector<struct Event>& events, ExitStatus& status);
-    ReportHead headOf(const PartPaths& paths, const Timeline& timeline) const;
-    std::optional<std::string> trackData(ExitStatus& status) const;
+    ReportHead headOf(const PartPaths& paths, std::size_t place, const Timeline& timeline) const;
+    /// Empty without one. Nothing after a complaint.
+    std::optional<Track> readTrack(ExitStatus& status) const;
+    void complainOfTrack(const std::string& reason, ExitStatus& status) const;
 
     const ReportOptions& _options;
     const Environment& _environment;

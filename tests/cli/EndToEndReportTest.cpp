@@ -3,7 +3,10 @@
 
 #include <nlohmann/json.hpp>
 
+#include <csignal>
 #include <filesystem>
+#include <fstream>
+#include <sys/stat.h>
 
 namespace pallax {
 namespace {
@@ -14,6 +17,10 @@ class EndToEndReport : public EndToEnd {
 protected:
     std::string sampleDrive() const { return PALLAX_SOURCE_DIR "/samples/lte-drive.pcap"; }
     std::string page() const { return world.path("drive.html"); }
+    std::string write(const std::string& name, const std::string& content) const {
+        std::ofstream(world.path(name)) << content;
+        return world.path(name);
+    }
 };
 
 TEST_F(EndToEndReport, WritesAPageThatItsUserAloneCanRead) {
@@ -94,6 +101,71 @@ TEST_F(EndToEndReport, WhatCannotBeWrittenLeavesNothing) {
     EXPECT_EQ(over.status, 1);
     EXPECT_EQ(over.err, "pallax: " + copy + " would be replaced by its report.\n");
     EXPECT_EQ(doubles::contentOf(copy), doubles::contentOf(sampleDrive()));
+}
+
+TEST_F(EndToEndReport, AFullDeviceIsOneSentenceAndStaysADevice) {
+    const std::string full = world.path("full");
+    fs::create_symlink("/dev/full", full); // so that nothing is lost if it were replaced
+    const Run made = run({"report", sampleDrive(), "-o", full});
+    EXPECT_EQ(made.status, 1);
+    EXPECT_EQ(made.err, "pallax: " + full + " cannot be written: No space left on device.\n");
+    EXPECT_TRUE(fs::is_character_file(full));
+    for (const char* argument : {"--json", "--output=-"}) {
+        doubles::PallaxProcess process(world, {"report", argument, sampleDrive()}, "/dev/null",
+                                       "/dev/full");
+        EXPECT_EQ(process.wait(), 1);
+        EXPECT_EQ(process.err(),
+                  "pallax: Standard output cannot be written: No space left on device.\n");
+    }
+}
+
+TEST_F(EndToEndReport, WhatIsNoWholeRecordingIsOneSentence) {
+    const auto refused = [this](const std::string& recording) {
+        const Run made = run({"report", recording, "-o", page()});
+        EXPECT_EQ(made.status, 1);
+        EXPECT_EQ(made.out, "");
+        EXPECT_FALSE(fs::exists(page()));
+        return made.err;
+    };
+    const std::string none = world.path("none.pcap");
+    EXPECT_EQ(refused(none), "pallax: " + none + " cannot be opened: No such file or directory.\n");
+    const std::string empty = write("empty.pcap", "");
+    EXPECT_EQ(refused(empty), "pallax: " + empty + " is empty.\n");
+    const std::string text = write("text", "This is a text.");
+    EXPECT_EQ(refused(text),
+              "pallax: " + text + " is not a recording: it is neither pcap nor pcapng.\n");
+    const std::string folder = world.path("folder");
+    fs::create_directory(folder);
+    EXPECT_EQ(refused(folder), "pallax: " + folder + " cannot be opened: it is a folder.\n");
+}
+
+TEST_F(EndToEndReport, ATimeThatIsNotThereIsOneSentence) {
+    const auto refused = [this](const char* from, const char* to) {
+        const Run made = run({"report", "--from", from, "--to", to, sampleDrive(), "-o", page()});
+        EXPECT_EQ(made.status, 1);
+        EXPECT_FALSE(fs::exists(page()));
+        return made.err;
+    };
+    EXPECT_EQ(refused("22:15", "22:14"),
+              "pallax: lte-drive.pcap: the time of --from is later than that of --to.\n");
+    EXPECT_EQ(refused("10:00", "end"),
+              "pallax: lte-drive.pcap: \"10:00\" is no time of the recording, which lasts from "
+              "2023-11-14 22:13:20 to 2023-11-14 22:15:19.\n");
+}
+
+TEST_F(EndToEndReport, EndsAtASignalAndLeavesNothing) {
+    const std::string fifo = world.path("fifo");
+    ASSERT_EQ(::mkfifo(fifo.c_str(), S_IRUSR | S_IWUSR), 0);
+    doubles::PallaxProcess process(world, {"report", fifo, "-o", page()});
+    std::ofstream writer(fifo, std::ios::binary); // waits for its reader
+    const std::string drive = doubles::contentOf(sampleDrive());
+    writer << drive.substr(0, drive.size() / 2) << std::flush;
+    process.signal(SIGINT);
+    EXPECT_EQ(process.wait(), -SIGINT);
+    EXPECT_EQ(process.err(), "");
+    for (const auto& entry : fs::directory_iterator(world.path())) {
+        EXPECT_FALSE(entry.path().filename().string().starts_with("drive.html")) << entry.path();
+    }
 }
 
 TEST_F(EndToEndReport, WrongUsageIsOneSentence) {

@@ -263,13 +263,15 @@ TEST(Options, EventsAreOfRecordings) {
 
 TEST(Options, AReportIsOfAPartAndHasAProfile) {
     const auto told = parsed<ReportOptions>(
-        {"report", "a", "b", "-o", "c.html", "--from", "14:02", "--to", "end", "--profile", "field",
-         "--title", "T", "--where", "rsrp < 1", "--track", "w.gpx", "--technology", "gsm"});
+        {"report", "a",         "b",        "-o",      "c.html", "--from",       "14:02", "--to",
+         "end",    "--profile", "field",    "--title", "T",      "--label",      "A",     "--label",
+         "B",      "--where",   "rsrp < 1", "--track", "w.gpx",  "--technology", "gsm"});
     EXPECT_EQ(told.recordings, (std::vector<std::string>{"a", "b"}));
     EXPECT_EQ(told.output, "c.html");
     EXPECT_TRUE(told.from && told.to && told.to->isEnd());
     EXPECT_EQ(told.profile, "field");
     EXPECT_EQ(told.title, "T");
+    EXPECT_EQ(told.labels, (std::vector<std::string>{"A", "B"}));
     EXPECT_EQ(told.where, "rsrp < 1");
     EXPECT_EQ(told.track, "w.gpx");
     EXPECT_EQ(told.technology->commandName, "gsm");

@@ -4,6 +4,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <map>
 #include <string>
 
@@ -106,6 +107,41 @@ TEST(DisplayColumns, AgreeWithAnyDisplays) {
             RC_ASSERT(shown == expected[tick]);
         }
     }));
+}
+
+TEST(DisplayColumns, KeepsABoundedNumberOfPlaces) {
+    DisplayColumns columns;
+    std::size_t next = 0;
+    for (std::uint32_t tick = 0; tick < 100; ++tick) {
+        Dictionary display;
+        for (int count = 0; count < 200; ++count) {
+            display.set(std::to_string(next++), "x");
+        }
+        columns.add(tick, display);
+        EXPECT_EQ(columns.isFull(), next >= DisplayColumns::kMostPlaces);
+    }
+    EXPECT_EQ(columns.columns().size(), DisplayColumns::kMostPlaces);
+    columns.add(100, Dictionary{{"0", "y"}});
+    const auto all = columns.columns();
+    const auto known = std::find_if(all.begin(), all.end(), [](const auto* column) {
+        return column->path == std::vector<std::string>{"0"};
+    });
+    ASSERT_NE(known, all.end());
+    EXPECT_EQ(columns.texts()[(*known)->changes.back().text], "y") << "it goes on";
+}
+
+TEST(DisplayColumns, SaysWhatIsLeftOut) {
+    DisplayColumns columns(
+        [](const std::vector<std::string>& path) { return path.back() == "ICCID"; });
+    columns.add(0, Dictionary{{"SIM", Dictionary{{"ICCID", "000"}, {"Slot", "000"}}}});
+    columns.add(1, Dictionary{{"SIM", Dictionary{{"Slot", "000"}}}});
+    ASSERT_EQ(columns.columns().size(), 2U);
+    const auto& iccid = *columns.columns()[0];
+    EXPECT_EQ(iccid.path, (std::vector<std::string>{"SIM", "ICCID"}));
+    ASSERT_EQ(iccid.changes.size(), 2U);
+    EXPECT_EQ(columns.texts()[iccid.changes[0].text], "left out");
+    EXPECT_EQ(iccid.changes[1].text, 0U) << "nothing is shown there any more";
+    EXPECT_EQ(columns.texts()[columns.columns()[1]->changes[0].text], "000");
 }
 
 } // namespace

@@ -30,6 +30,7 @@ protected:
         _values.values.clear();
         _values.read(second, display);
         report.take({ValuesFixture::at(second), _values.values, display, isAfterStep});
+        masked.take({ValuesFixture::at(second), _values.values, display, isAfterStep});
         second += 2;
     }
     const ReportNeighbour* neighbour(const std::string& cell) const {
@@ -45,6 +46,7 @@ protected:
     NetworkNames names;
     QualityProfile profile = *builtInProfile(kDefaultProfile);
     ReportBuilder report{names, profile};
+    ReportBuilder masked{names, profile, [](const auto& path) { return path.back() == "APN"; }};
 
 private:
     ValuesFixture _values{"lte"};
@@ -116,7 +118,10 @@ TEST_F(ReportBuilderTest, NothingHoldsOverAStepOfTheClock) {
     report.finish();
     EXPECT_EQ(report.measures()[0].spread.total(), 4);
     EXPECT_EQ(report.stays().size(), 2U);
-    EXPECT_EQ(report.stretches(), (std::vector<std::uint32_t>{0, 1}));
+    ASSERT_EQ(report.stretches().size(), 2U);
+    EXPECT_EQ(report.stretches()[1].tick, 1U);
+    EXPECT_EQ(report.stays()[0].stretch, 0U);
+    EXPECT_EQ(report.stays()[1].stretch, 1U);
 }
 
 TEST_F(ReportBuilderTest, ANeighbourIsComparedWithTheServingCell) {
@@ -169,6 +174,20 @@ TEST_F(ReportBuilderTest, AContextIsThereAsLongAsTheDisplayHasIt) {
     ASSERT_EQ(spans.size(), 1U);
     EXPECT_EQ(spans[0].to - spans[0].from, std::chrono::seconds(4));
     EXPECT_EQ(spans[0].text, "Active");
+}
+
+TEST_F(ReportBuilderTest, AMaskedContextHasANumberInsteadOfItsName) {
+    const Dictionary one{{"APN", "00000000"}, {"State", "000000"}};
+    const PropertyList two(Array{one, one});
+    tick(with(serving("182", "-90.00 dBm"), "PDP Context Info", PropertyList(Array{one})));
+    tick(with(serving("182", "-90.00 dBm"), "PDP Context Info", two));
+    masked.finish();
+    ASSERT_EQ(masked.contexts().size(), 2U) << "though their zeros are the same";
+    ASSERT_TRUE(masked.contexts().contains("context 1") && masked.contexts().contains("context 2"));
+    const auto& spans = masked.contexts().at("context 2").spans();
+    ASSERT_EQ(spans.size(), 1U);
+    EXPECT_EQ(spans[0].from, ValuesFixture::at(2));
+    EXPECT_EQ(spans[0].text, "there");
 }
 
 TEST_F(ReportBuilderTest, KeepsABoundedNumberOfNeighboursAndSaysSo) {

@@ -71,6 +71,9 @@ TEST_F(ReportCommandTest, LeavesOutWhatIdentifiesAPerson) {
     const std::string content = pageContent(*page, "figures-0");
     EXPECT_NE(content.find("\"identities\":\"left out\""), std::string::npos);
     EXPECT_NE(content.find("EF-ICCID"), std::string::npos) << "the field is there";
+    EXPECT_NE(content.find("\"left out\""), std::string::npos);
+    EXPECT_EQ(content.find("\"0000"), std::string::npos) << "no zeros stand for it";
+    EXPECT_NE(content.find("\"context up\""), std::string::npos) << "without its name";
     for (const char* identity : {"89490200001234567890", "+4915112345678", "10.17.4.21"}) {
         EXPECT_EQ(content.find(identity), std::string::npos) << identity;
     }
@@ -89,6 +92,18 @@ TEST_F(ReportCommandTest, TheSameInputGivesTheSameBytes) {
         ASSERT_TRUE(page) << name;
         EXPECT_EQ(make({sample(name)}), page) << name;
     }
+}
+
+TEST_F(ReportCommandTest, NamesTheDeviceOfEachRecording) {
+    options.labels = {"phone A", "phone B"};
+    const auto page = make({sample("lte-drive.pcap"), sample("umts-drive.pcap")});
+    ASSERT_TRUE(page);
+    EXPECT_EQ(json::parse(pageContent(*page, "figures-0"))["figures"]["head"]["label"], "phone A");
+    EXPECT_EQ(json::parse(pageContent(*page, "figures-1"))["figures"]["head"]["label"], "phone B");
+    EXPECT_FALSE(make({sample("lte-drive.pcap")}));
+    EXPECT_EQ(status, kExitWrongUsage);
+    EXPECT_EQ(reports, std::vector<std::string>{
+                           "--label is for one recording each (see pallax report --help)"});
 }
 
 TEST_F(ReportCommandTest, HasAPartOfTheTime) {
@@ -142,6 +157,11 @@ TEST_F(ReportCommandTest, HasAStretchForEachTimeThatTheClockWasSetBack) {
     EXPECT_EQ(report["head"]["stretches"][0]["ticks"], 60);
     EXPECT_LT(report["head"]["stretches"][1]["from"], report["head"]["stretches"][0]["from"]);
     EXPECT_EQ(report["head"]["timeSteps"], 1);
+    for (const json& event : report["events"]) {
+        EXPECT_EQ(event["stretch"], event["packet"] > 1200 ? 1 : 0) << event;
+    }
+    EXPECT_EQ(report["cells"].front()["stretch"], 0);
+    EXPECT_EQ(report["cells"].back()["stretch"], 1);
 }
 
 TEST_F(ReportCommandTest, DrawsATrack) {
@@ -156,6 +176,20 @@ TEST_F(ReportCommandTest, DrawsATrack) {
     EXPECT_EQ(status, kExitFailure);
     EXPECT_EQ(reports, std::vector<std::string>{options.track +
                                                 " cannot be used as a track: it is no XML."});
+}
+
+TEST_F(ReportCommandTest, RefusesATrackOfAnotherTime) {
+    for (const char* time :
+         {"2023-11-13T22:13:22Z", "2023-11-14T22:13:17Z", "2023-11-14T22:15:21Z"}) {
+        options.track = file("way.gpx", std::string("<gpx><trk><trkseg><trkpt lat=\"50.5\" ") +
+                                            "lon=\"7.25\"><time>" + time +
+                                            "</time></trkpt></trkseg></trk></gpx>");
+        EXPECT_FALSE(make({sample("lte-drive.pcap")})) << time;
+        EXPECT_EQ(status, kExitFailure);
+        EXPECT_EQ(reports, std::vector<std::string>{options.track +
+                                                    " cannot be used as a track: none of its "
+                                                    "points is in the time of the report."});
+    }
 }
 
 TEST_F(ReportCommandTest, WhatCannotBeReadIsOneSentence) {

@@ -32,13 +32,16 @@ test('an hour of LTE at every tick has at most 1 MB', () => {
 
 test('the state at twenty random instants is what decode shows', async () => {
     pallax('mask', file('hour.pcap'), '-o', file('masked.pcap'));
-    const ticks = pallax('decode', '--every', 'tick', file('masked.pcap')).trim().split('\n');
+    const [ticks, maskedTicks] = ['hour.pcap', 'masked.pcap'].map((name) => pallax('decode', '--every', 'tick', file(name)).trim().split('\n'));
     const { page, problems } = await open(browser, hour);
     const random = randomNumbers(20);
     for (let i = 0; i < 20; ++i) {
-        const { time, display } = JSON.parse(ticks[Math.floor(random() * ticks.length)]);
+        const tick = Math.floor(random() * ticks.length);
+        const { time, display } = JSON.parse(ticks[tick]);
         const expected = leavesOf(display);
-        assert.ok(expected.size > 30);
+        const masked = leavesOf(JSON.parse(maskedTicks[tick]).display);
+        for (const [path, text] of masked) if (text !== expected.get(path)) expected.set(path, 'left out');
+        assert.ok(expected.size > 30 && [...expected.values()].includes('left out'));
         assert.deepEqual(await shownState(page, Date.parse(time) / 1000), expected, time);
     }
     assertClean(problems);
@@ -76,6 +79,8 @@ test('the keyboard looks at ticks, zooms and shows all', async () => {
     await page.keyboard.press('+');
     const zoomed = await model();
     assert.ok(Math.abs((zoomed.to - zoomed.from) / (start.to - start.from) - 0.5) < 0.01);
+    await page.waitForTimeout(100);
+    assert.equal((await model()).cursor, start.cursor - 2, 'a zoom does not move the cursor');
     await page.keyboard.press('0');
     assert.deepEqual([(await model()).from, (await model()).to], [start.from, start.to]);
     await page.keyboard.press('Home');
@@ -88,6 +93,8 @@ test('dragging zooms all curves, and a verdict leads to its worst minute', async
     const { page } = await open(browser, hour);
     const plot = await page.locator('.plot .u-over').first().boundingBox();
     await page.mouse.move(plot.x + 0.25 * plot.width, plot.y + 40);
+    const pointed = await page.evaluate(() => globalThis.pallaxModels[0].cursor);
+    assert.ok(Math.abs(pointed - 1700000002 - 3598 / 4) < 20, `${pointed}`);
     await page.mouse.down();
     await page.mouse.move(plot.x + 0.5 * plot.width, plot.y + 40, { steps: 4 });
     await page.mouse.up();
@@ -96,6 +103,18 @@ test('dragging zooms all curves, and a verdict leads to its worst minute', async
     await page.getByTitle(/worst minute of RSRP/).click();
     const { measures } = JSON.parse(pallax('report', '--json', file('hour.pcap')));
     assert.equal(await page.evaluate(() => globalThis.pallaxModels[0].cursor), measures[0].worstStretch.from);
+    await page.context().close();
+});
+
+test('contexts are told without what identifies a person', async () => {
+    const { page } = await open(browser, hour);
+    const rows = await page.locator('#contexts tbody tr').allTextContents();
+    assert.equal(rows.length, 2);
+    assert.match(rows[0], /^context 1there1/);
+    assert.match(rows[1], /^context 2there\d\d/);
+    await page.locator('#contexts tbody tr').nth(1).getByRole('button').click();
+    const { contexts } = JSON.parse(pallax('report', '--json', file('hour.pcap')));
+    assert.equal(await page.evaluate(() => globalThis.pallaxModels[0].cursor), contexts[1].spans[0].from);
     await page.context().close();
 });
 
@@ -113,32 +132,68 @@ test('events are filtered by kind and words, and lead to their instant', async (
     await page.context().close();
 });
 
-/** A recording of one message of the object stream, as XML. */
-function writeMessage(name, xml) {
-    const bytes = Buffer.from(`<?xml version="1.0"?><plist version="1.0">${xml}</plist>`);
-    const head = Buffer.alloc(24 + 16);
+/** A recording of messages of the object stream, as XML, each with its second. */
+function writeMessages(name, messages) {
+    const head = Buffer.alloc(24);
     head.writeUInt32LE(0xa1b2c3d4, 0);
     head.writeUInt16LE(2, 4);
     head.writeUInt16LE(4, 6);
     head.writeUInt32LE(65535, 16);
     head.writeUInt32LE(147, 20);
-    head.writeUInt32LE(1700000000, 24);
-    head.writeUInt32LE(bytes.length, 32);
-    head.writeUInt32LE(bytes.length, 36);
-    writeFileSync(file(name), Buffer.concat([head, bytes]));
+    const packets = messages.flatMap(([second, xml]) => {
+        const bytes = Buffer.from(`<?xml version="1.0"?><plist version="1.0">${xml}</plist>`);
+        const before = Buffer.alloc(16);
+        before.writeUInt32LE(second, 0);
+        before.writeUInt32LE(bytes.length, 8);
+        before.writeUInt32LE(bytes.length, 12);
+        return [before, bytes];
+    });
+    writeFileSync(file(name), Buffer.concat([head, ...packets]));
     return file(name);
 }
+
+test('where the clock was set back, each stretch of time can be shown', async () => {
+    const message = (second, bsic) => [second, `<dict><key>Serving Cell</key><dict><key>ARFCN</key><string>62</string><key>BSIC</key>` +
+        `<string>${bsic}</string><key>Rx Level</key><string>-${bsic.replace(',', '')} dBm</string></dict></dict>`];
+    const begin = 1700000000;
+    const seconds = Array.from({ length: 30 }, (_, i) => 2 * i);
+    const recording = writeMessages('back.pcap', [...seconds.map((i) => message(begin + i, '7,1')),
+        ...seconds.slice(0, 10).map((i) => message(begin + 10 + i, '9,2'))]);
+    const { page, problems } = await open(browser, report('back.html', recording));
+    const choice = page.getByLabel('Stretch of time');
+    const caption = page.locator('#state-table caption');
+    const reading = page.locator('.reading').first();
+    assert.deepEqual(await choice.locator('option').allTextContents(), ['1 of 2: 2023-11-14 22:13:22 to 2023-11-14 22:14:20',
+        '2 of 2: 2023-11-14 22:13:32 to 2023-11-14 22:13:50']);
+    assert.equal(await reading.textContent(), '-71 dBm');
+    await choice.selectOption('1');
+    await page.waitForFunction(() => document.querySelector('.reading').textContent === '-92 dBm');
+    assert.equal(await caption.textContent(), 'State at 2023-11-14 22:13:50 UTC');
+    assert.ok(await page.getByText('It begins 48 s before the end of stretch 1.').isVisible());
+    assert.deepEqual(await page.evaluate(() => {
+        const model = globalThis.pallaxModels[0];
+        return model.inStretch(model.figures.cells).map((stay) => stay.cell);
+    }), ['BSIC 9,2']);
+    await choice.selectOption('0');
+    await page.locator('ol.events li', { hasText: 'time-step' }).getByRole('button').click();
+    assert.equal(await choice.inputValue(), '1');
+    await page.waitForFunction(() => document.querySelector('.reading').textContent === '–');
+    assert.equal(await page.locator('h1').textContent(), 'Drive of 2023-11-14, 22:13:22 to 22:14:20 UTC');
+    assertClean(problems);
+    await page.context().close();
+});
 
 test('texts of a modem that look like markup are shown as texts', async () => {
     const evil = '<script>alert(1)</script><img src=x onerror=alert(2)>';
     const escaped = evil.replaceAll('<', '&lt;').replaceAll('>', '&gt;');
-    const recording = writeMessage('evil.pcap', `<dict><key>Network</key><dict><key>Name</key><string>${escaped}</string>` +
+    const recording = writeMessages('evil.pcap', [[1700000000, `<dict><key>Network</key><dict><key>Name</key><string>${escaped}</string>` +
         `<key>MCC</key><string>262</string><key>MNC</key><string>42</string></dict><key>${escaped}</key><string>${escaped}</string>` +
-        `<key>Serving Cell</key><dict><key>ARFCN</key><string>${escaped}</string></dict></dict>`);
-    const url = report('evil.html', recording, '--with-identities', '--title', evil);
+        `<key>Serving Cell</key><dict><key>ARFCN</key><string>${escaped}</string></dict></dict>`]]);
+    const url = report('evil.html', recording, '--with-identities', '--title', evil, '--label', evil);
     const { page, problems } = await open(browser, url);
     assert.equal(await page.locator('h1').textContent(), evil);
     assert.equal(await page.title(), evil);
+    assert.ok((await page.locator('.lead').textContent()).startsWith(`${evil} · IFX · `));
     const state = await shownState(page, 1700000002);
     assert.equal(state.get(evil), evil);
     assert.equal(await page.locator('img').count(), 0);

@@ -5,7 +5,7 @@ export function seriesColour(place: number): string {
     return series[place % series.length]!;
 }
 
-/** The same cell has the same colour everywhere on the page. */
+/** A serving cell has the same colour in the lanes and in the table. */
 export class CellColours {
     private readonly places = new Map<string, number>();
 

@@ -84,21 +84,16 @@ export class FrozenSource implements Source {
         return Promise.resolve(this.described.figures);
     }
 
-    /** The ticks between two times, in the first stretch that has some of them. */
-    private range(from: number, to: number): [number, number] {
-        let begin = 0;
-        for (const stretch of this.described.figures.head.stretches) {
-            const end = begin + stretch.ticks;
-            if (stretch.from <= to && from <= stretch.to) {
-                return [lowerBound(this.times, from, begin, end), lowerBound(this.times, to, begin, end, true)];
-            }
-            begin = end;
-        }
-        return [0, 0];
+    /** The ticks of a stretch. */
+    private range(stretch: number): [number, number] {
+        const counts = this.described.figures.head.stretches.map((each) => each.ticks);
+        const begin = counts.slice(0, stretch).reduce((sum, each) => sum + each, 0);
+        return [begin, begin + (counts[stretch] ?? 0)];
     }
 
-    series(ids: readonly number[], from: number, to: number, points: number): Promise<Drawn> {
-        const [begin, end] = this.range(from, to);
+    series(ids: readonly number[], from: number, to: number, points: number, stretch: number): Promise<Drawn> {
+        const [first, last] = this.range(stretch);
+        const [begin, end] = [lowerBound(this.times, from, first, last), lowerBound(this.times, to, first, last, true)];
         const all = ids.map((id) => this.valuesOf(id));
         return Promise.resolve(thinned(this.times, all, begin, end, points));
     }
@@ -114,18 +109,9 @@ export class FrozenSource implements Source {
         return values;
     }
 
-    stateAt(time: number): Promise<State> {
-        const [begin, end] = this.range(-Infinity, Infinity);
-        let tick = Math.max(begin, end - 1);
-        for (let from = 0, i = 0; i < this.described.figures.head.stretches.length; ++i) {
-            const stretch = this.described.figures.head.stretches[i]!;
-            if (time <= stretch.to || i === this.described.figures.head.stretches.length - 1) {
-                tick = Math.max(from, lowerBound(this.times, time, from, from + stretch.ticks, true) - 1);
-                break;
-            }
-            from += stretch.ticks;
-        }
-        return Promise.resolve(this.stateOf(tick));
+    stateAt(time: number, stretch: number): Promise<State> {
+        const [first, last] = this.range(stretch);
+        return Promise.resolve(this.stateOf(Math.max(first, lowerBound(this.times, time, first, last, true) - 1)));
     }
 
     private stateOf(tick: number): State {

@@ -8,6 +8,7 @@ import { Model } from './model.js';
 import type { Source } from './source.js';
 import { cellsView, neighboursView } from './views/cells.js';
 import { compareView } from './views/compare.js';
+import { contextsView } from './views/contexts.js';
 import { distributionView } from './views/distribution.js';
 import { eventsView } from './views/events.js';
 import { headView } from './views/head.js';
@@ -47,7 +48,7 @@ async function recordingPage(model: Model, track: TrackPoint[] | null, more: HTM
     const timeline = timelineView(model);
     const page = h('div', { class: 'recording' }, headView(model), ...more, verdictView(model),
         h('div', { class: 'beside' }, timeline.element, stateView(model)),
-        ...(track ? [trackView(model, track)] : []), distributionView(model), cellsView(model), neighboursView(model), eventsView(model));
+        ...(track ? [trackView(model, track)] : []), distributionView(model), cellsView(model), neighboursView(model), contextsView(model), eventsView(model));
     followLook(model);
     document.getElementById('page')!.replaceChildren(page);
     await timeline.start();

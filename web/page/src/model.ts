@@ -1,13 +1,15 @@
 // What all views share: the data, the shown part of the time, and the instant that is looked at.
 import { CellColours } from './colours.js';
-import type { Figures, Seconds, Source } from './source.js';
+import type { Figures, Located, Seconds, Source } from './source.js';
 
-export type Part = 'data' | 'window' | 'cursor' | 'look';
+export type Part = 'data' | 'stretch' | 'window' | 'cursor' | 'look';
 type Listener = () => void;
 
 const leastWindow = 4;
 
 export class Model {
+    /** The shown one of the stretches of time. */
+    stretch: number;
     from: Seconds;
     to: Seconds;
     cursor: Seconds;
@@ -18,6 +20,7 @@ export class Model {
         readonly source: Source,
         public figures: Figures,
     ) {
+        this.stretch = source.isLive ? this.latest() : this.longest();
         [this.from, this.to] = this.whole();
         this.cursor = this.to;
         this.colours = new CellColours(figures.cells.map((stay) => stay.cell));
@@ -31,17 +34,44 @@ export class Model {
         for (const [wanted, listener] of this.listeners) if (wanted === part) listener();
     }
 
-    /** The time of the longest stretch: where the clock was set back, times are not unique. */
+    private longest(): number {
+        const ticks = this.figures.head.stretches.map((stretch) => stretch.ticks);
+        return Math.max(ticks.indexOf(ticks.reduce((a, b) => Math.max(a, b), 0)), 0);
+    }
+
+    private latest(): number {
+        return Math.max(this.figures.head.stretches.length - 1, 0);
+    }
+
+    /** The time of the shown stretch; its first tick shows what happened in the interval before it. */
     whole(): [Seconds, Seconds] {
-        const { stretches, from, to } = this.figures.head;
-        const longest = [...stretches].sort((a, b) => b.ticks - a.ticks)[0] ?? { from, to };
-        return [longest.from, Math.max(longest.to, longest.from + leastWindow)];
+        const { stretches, from, to, interval } = this.figures.head;
+        const shown = stretches[this.stretch] ?? { from, to };
+        return [shown.from - interval, Math.max(shown.to, shown.from - interval + leastWindow)];
+    }
+
+    /** What is in the shown stretch. */
+    inStretch<T extends Located>(all: readonly T[]): T[] {
+        return all.filter((each) => each.stretch === this.stretch);
+    }
+
+    /** Shows the whole of another stretch. */
+    choose(stretch: number): void {
+        this.stretch = stretch;
+        this.tell('stretch');
+        this.showAll();
+        this.look(this.to);
     }
 
     update(figures: Figures): void {
         const [from, to] = this.whole();
         const [atFrom, atEnd, atCursor] = [this.from <= from, this.to >= to, this.cursor >= to];
+        const wasLatest = this.stretch === this.latest();
         this.figures = figures;
+        if (wasLatest && this.stretch !== this.latest() && atEnd) {
+            this.stretch = this.latest();
+            [this.from, this.to] = this.whole();
+        }
         this.colours = new CellColours(figures.cells.map((stay) => stay.cell));
         const [newFrom, end] = this.whole();
         if (atEnd) {
@@ -85,7 +115,8 @@ export class Model {
     }
 
     /** Goes to an instant that may not be shown. */
-    goTo(time: Seconds, until = time): void {
+    goTo(time: Seconds, until = time, stretch = this.stretch): void {
+        if (stretch !== this.stretch) this.choose(stretch);
         if (time < this.from || until > this.to) {
             const half = Math.max((this.to - this.from) / 2, until - time);
             this.show((time + until) / 2 - half, (time + until) / 2 + half);

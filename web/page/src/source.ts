@@ -8,10 +8,10 @@ export interface Source {
     readonly isLive: boolean;
     /** What `pallax report --json` prints. */
     figures(): Promise<Figures>;
-    /** At most about `points` points between two times, on one ascending axis for all series. */
-    series(ids: readonly number[], from: Seconds, to: Seconds, points: number): Promise<Drawn>;
-    /** The state at the latest tick at or before a time, or else at the first. */
-    stateAt(time: Seconds): Promise<State>;
+    /** At most about `points` points between two times of a stretch, on one ascending axis for all series. */
+    series(ids: readonly number[], from: Seconds, to: Seconds, points: number, stretch: number): Promise<Drawn>;
+    /** The state at the latest tick of a stretch at or before a time, or else at its first. */
+    stateAt(time: Seconds, stretch: number): Promise<State>;
     /** Calls the listener at each display tick of a live modem. Returns what stops that. */
     onTick(listener: (figures: Figures) => void): () => void;
 }
@@ -28,6 +28,8 @@ export interface Figures {
 
 export interface Head {
     title: string;
+    /** Of the device, as its user calls it. */
+    label: string;
     recording: string;
     technology: string;
     operator: string;
@@ -82,11 +84,17 @@ export interface Measure {
     /** Of that time, the best first; empty if the profile does not judge it. */
     shares: { grade: string; share: number }[];
     quantiles: { p5: number; p50: number; p95: number; least: number; most: number } | null;
-    worstStretch: { from: Seconds; to: Seconds; mean: number } | null;
+    worstStretch: ({ from: Seconds; to: Seconds; mean: number } & Located) | null;
+}
+
+/** Where the clock was set back, a time alone does not tell when something was. */
+export interface Located {
+    /** Its place in `Head.stretches`. */
+    stretch: number;
 }
 
 /** A stay in a cell. */
-export interface Stay {
+export interface Stay extends Located {
     system: string;
     cell: string;
     details: string[];
@@ -116,10 +124,10 @@ export interface Neighbour {
 
 export interface Lane {
     name: string;
-    spans: { from: Seconds; to: Seconds; text: string }[];
+    spans: ({ from: Seconds; to: Seconds; text: string } & Located)[];
 }
 
-export interface EventRow {
+export interface EventRow extends Located {
     time: Seconds;
     packet: number;
     kind: string;

@@ -6,6 +6,7 @@ const { denseOf, thinned, valueAt, valueNear } = await load('changes');
 const text = await load('text');
 const { cumulativeOf, histogramOf, inCell } = await load('spread');
 const { differencesBetween } = await load('compare');
+const { chartedNeighbours } = await load('neighbours');
 const { placeAt, placedOf, scaleLength } = await load('track');
 
 const changes = { ticks: Uint32Array.of(2, 5), values: Float32Array.of(-90, NaN) };
@@ -45,10 +46,13 @@ test('a value is not known for longer than ten seconds', () => {
 
 test('times are ISO, of 24 hours, in UTC', () => {
     assert.equal(text.timeText(1700000000.9), '2023-11-14 22:13:20');
-    assert.equal(text.titleOf({ title: '', from: 1700000000, to: 1700001800 }), 'Drive of 2023-11-14, 22:13:20 to 22:43:20 UTC');
-    assert.equal(text.titleOf({ title: '', from: 1700000000, to: 1700010000 }),
+    assert.equal(text.titleOf({ title: '', from: 1700000000, to: 1700001800, stretches: [] }), 'Drive of 2023-11-14, 22:13:20 to 22:43:20 UTC');
+    assert.equal(text.titleOf({ title: '', from: 1700000000, to: 1700010000, stretches: [] }),
         'Drive of 2023-11-14, 22:13:20 to 2023-11-15 01:00:00 UTC');
-    assert.equal(text.titleOf({ title: 'Mine', from: 0, to: 0 }), 'Mine');
+    assert.equal(text.titleOf({ title: '', from: 1700000000, to: 1699990060,
+        stretches: [{ from: 1700000000, to: 1700000060 }, { from: 1699990000, to: 1699990060 }] }),
+    'Drive of 2023-11-14, 19:26:40 to 22:14:20 UTC', 'the clock was set back');
+    assert.equal(text.titleOf({ title: 'Mine', from: 0, to: 0, stretches: [] }), 'Mine');
     assert.deepEqual([48, 200, 3900].map(text.durationText), ['48 s', '3 min 20 s', '1 h 05 min']);
 });
 
@@ -74,17 +78,19 @@ test('a place of the display is judged by its path', () => {
 });
 
 test('a histogram counts seconds, and a hole counts ten of them', () => {
-    const bins = histogramOf([0, 2, 4, 100], [-90.5, -90.25, null, -88], 10);
+    const bins = histogramOf([{ times: [0, 2, 4, 100], values: [[-90.5, -90.25, null, -88]] }], 10);
     assert.deepEqual(bins.map((bin) => [bin.from, bin.seconds]), [[-91, 4], [-90, 0], [-89, 0], [-88, 2]]);
     assert.deepEqual(cumulativeOf(bins).map((share) => share.toFixed(2)), ['0.67', '0.67', '0.67', '1.00']);
-    assert.deepEqual(histogramOf([0], [null], 10), []);
-    assert.deepEqual(histogramOf([0, 60], [-90, null], 10).map((bin) => bin.seconds), [10]);
+    assert.deepEqual(histogramOf([{ times: [0], values: [[null]] }], 10), []);
+    assert.deepEqual(histogramOf([{ times: [0, 60], values: [[-90, null]] }], 10).map((bin) => bin.seconds), [10]);
+    const stretch = { times: [0, 2], values: [[-90, -90]] };
+    assert.deepEqual(histogramOf([stretch, stretch], 10).map((bin) => bin.seconds), [8], 'each stretch counts');
 });
 
 test('values in one cell are those of its stays', () => {
     const stays = [{ cell: 'PCI 1', from: 0, to: 2 }, { cell: 'PCI 2', from: 2, to: 6 }, { cell: 'PCI 1', from: 6, to: 9 }];
     const drawn = { times: [0, 4, 8, 12], values: [[1, 2, 3, 4]] };
-    assert.deepEqual(inCell(drawn, 0, stays, 'PCI 1'), [1, null, 3, null]);
+    assert.deepEqual(inCell(drawn, stays, 'PCI 1'), { times: drawn.times, values: [[1, null, 3, null]] });
 });
 
 const figures = (p50, poor, more = {}) => ({
@@ -117,4 +123,10 @@ test('a track is drawn to scale, north up', () => {
     assert.equal(placeAt(points, -1), null);
     assert.equal(placeAt(points, 11), null);
     assert.deepEqual([10, 900, 3000, 16000].map(scaleLength), [2, 200, 1000, 5000]);
+});
+
+test('of the neighbours of each system and measure six have a curve', () => {
+    const cell = (id, system, seconds = 2) => ({ id, system, measure: 'rsrp', unit: 'dBm', seconds });
+    const all = [cell(1, 'LTE', 0), ...[2, 3, 4, 5, 6, 7, 8].map((id) => cell(id, 'LTE')), cell(9, 'GSM')];
+    assert.deepEqual(chartedNeighbours(all).map((group) => group.map((each) => each.id)), [[2, 3, 4, 5, 6, 7], [9]]);
 });

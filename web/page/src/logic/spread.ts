@@ -7,15 +7,17 @@ export interface Bin {
     seconds: number;
 }
 
-/** Whole-numbered bins of one unit from the least to the greatest value, with the seconds in each. */
-export function histogramOf(times: readonly number[], values: readonly (number | null)[], longest: number): Bin[] {
+/** Whole-numbered bins of one unit from the least to the greatest value, with the seconds in each; of the first series. */
+export function histogramOf(pieces: readonly Drawn[], longest: number): Bin[] {
     const seconds = new Map<number, number>();
-    for (let i = 0; i < times.length; ++i) {
-        const value = values[i];
-        if (value === null || value === undefined || Number.isNaN(value)) continue;
-        const bin = Math.floor(value);
-        const held = i + 1 < times.length ? Math.min(times[i + 1]! - times[i]!, longest) : Math.min(2, longest);
-        seconds.set(bin, (seconds.get(bin) ?? 0) + Math.max(held, 0));
+    for (const { times, values } of pieces) {
+        for (let i = 0; i < times.length; ++i) {
+            const value = values[0]![i];
+            if (value === null || value === undefined || Number.isNaN(value)) continue;
+            const bin = Math.floor(value);
+            const held = i + 1 < times.length ? Math.min(times[i + 1]! - times[i]!, longest) : Math.min(2, longest);
+            seconds.set(bin, (seconds.get(bin) ?? 0) + held);
+        }
     }
     if (seconds.size === 0) return [];
     const least = Math.min(...seconds.keys());
@@ -35,13 +37,14 @@ export function cumulativeOf(bins: readonly Bin[]): number[] {
     });
 }
 
-/** The values while the phone was in one cell; the others are null. */
-export function inCell(drawn: Drawn, which: number, stays: readonly Stay[], cell: string): (number | null)[] {
+/** The first series while the phone was in one cell; its other values are null. */
+export function inCell(drawn: Drawn, stays: readonly Stay[], cell: string): Drawn {
     const own = stays.filter((stay) => stay.cell === cell);
     let next = 0;
-    return drawn.values[which]!.map((value, i) => {
+    const values = drawn.values[0]!.map((value, i) => {
         const time = drawn.times[i]!;
         while (next < own.length && own[next]!.to < time) ++next;
         return next < own.length && own[next]!.from <= time ? value : null;
     });
+    return { times: drawn.times, values: [values] };
 }

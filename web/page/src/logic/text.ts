@@ -48,12 +48,17 @@ export function measureName(measure: Measure, all: readonly Measure[]): string {
     return systems.size > 1 ? `${measure.system} ${measure.name}` : measure.name;
 }
 
+/** The earliest and the latest time: the clock can have been set back. */
+export function limitsOf({ from, to, stretches }: Pick<Head, 'from' | 'to' | 'stretches'>): [Seconds, Seconds] {
+    return [stretches.reduce((least, each) => Math.min(least, each.from), from), stretches.reduce((most, each) => Math.max(most, each.to), to)];
+}
+
 /** "Drive of 2023-11-14, 22:13:20 to 22:43:20 UTC". */
-export function titleOf(head: Head): string {
+export function titleOf(head: Pick<Head, 'title' | 'from' | 'to' | 'stretches'>): string {
     if (head.title) return head.title;
-    const isOneDay = dateText(head.from) === dateText(head.to);
-    const to = isOneDay ? clockText(head.to) : timeText(head.to);
-    return `Drive of ${dateText(head.from)}, ${clockText(head.from)} to ${to} UTC`;
+    const [from, to] = limitsOf(head);
+    const end = dateText(from) === dateText(to) ? clockText(to) : timeText(to);
+    return `Drive of ${dateText(from)}, ${clockText(from)} to ${end} UTC`;
 }
 
 /** The grade of a value; empty where nothing judges it. */

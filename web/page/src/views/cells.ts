@@ -1,4 +1,6 @@
+import { seriesColour } from '../colours.js';
 import { button, section, table, h, type Cell } from '../dom.js';
+import { chartedNeighbours } from '../logic/neighbours.js';
 import { clockText, durationText, levelText } from '../logic/text.js';
 import type { Model } from '../model.js';
 import type { Stay } from '../source.js';
@@ -21,20 +23,23 @@ function totalsOf(stays: readonly Stay[]): Total[] {
     return [...totals.values()].sort((a, b) => b.seconds - a.seconds);
 }
 
-function nameWithColour(model: Model, cell: string): HTMLElement {
+function nameWithColour(cell: string, colour: string): HTMLElement {
     const key = h('span', { class: 'key', 'aria-hidden': 'true' });
-    key.style.background = model.colours.of(cell);
+    key.style.background = colour;
     return h('span', {}, key, cell);
 }
 
 function rowOf(model: Model, total: Total): Cell[] {
     const seconds = total.stays.map((stay) => stay.to - stay.from).sort((a, b) => a - b);
     const longest = total.stays.find((stay) => stay.to - stay.from === seconds.at(-1))!;
-    return [nameWithColour(model, total.stay.cell), total.stay.details.join(' · '), String(total.stays.length),
+    return [nameWithColour(total.stay.cell, model.colours.of(total.stay.cell)), total.stay.details.join(' · '), String(total.stays.length),
         durationText(total.seconds), durationText(seconds[Math.floor(seconds.length / 2)]!), durationText(seconds[0]!),
         String(total.stays.filter((stay) => stay.pingPong).length),
-        button(clockText(longest.from), `Show the longest stay in ${total.stay.cell}`, () => model.goTo(longest.from, longest.to))];
+        button(clockText(longest.from), `Show the longest stay in ${total.stay.cell}`, () => model.goTo(longest.from, longest.to, longest.stretch))];
 }
+
+/** A browser takes long for more rows. */
+const mostRows = 500;
 
 /** The cells that served, with how long each stay was. */
 export function cellsView(model: Model): HTMLElement {
@@ -42,8 +47,8 @@ export function cellsView(model: Model): HTMLElement {
     const draw = (): void => {
         const totals = totalsOf(model.figures.cells);
         place.replaceChildren(totals.length === 0 ? h('p', {}, 'No serving cell is known.')
-            : table('Serving cells, the longest first', ['Cell', 'What is known', '#Stays', '#Total', '#Median stay', '#Shortest',
-                '#Ping-pongs', 'Longest stay'], totals.map((total) => rowOf(model, total))));
+            : table(totals.length > mostRows ? `The ${mostRows} longest of ${totals.length} serving cells` : 'Serving cells, the longest first', ['Cell', 'What is known', '#Stays', '#Total', '#Median stay', '#Shortest',
+                '#Ping-pongs', 'Longest stay'], totals.slice(0, mostRows).map((total) => rowOf(model, total))));
     };
     draw();
     model.on('data', draw);
@@ -55,12 +60,14 @@ export function neighboursView(model: Model): HTMLElement {
     const place = h('div');
     const draw = (): void => {
         const { neighbours, measures } = model.figures;
+        const charted = chartedNeighbours(neighbours).flatMap((group) => group.map((each, i) => [each.id, seriesColour(i)] as const));
+        const colours = new Map(charted);
         const rows = neighbours.map((each): Cell[] => {
             const remarks = [each.served ? 'served' : '', each.seconds === 0 && each.detected > 0 ? 'missing from the list' : '',
                 each.seconds > 0 && each.detected > 0 ? `found without the list for ${durationText(each.detected)}` : '',
                 each.unlisted > 0 ? `${each.unlisted} × serving without being in the list` : ''];
             const serving = measures.some((measure) => measure.system === each.system && measure.measure === each.measure);
-            return [nameWithColour(model, each.cell), durationText(each.seconds),
+            return [nameWithColour(each.cell, colours.get(each.id) ?? 'transparent'), durationText(each.seconds),
                 each.best === null ? '–' : levelText(each.best, each.unit), each.median === null ? '–' : levelText(each.median, each.unit),
                 serving ? durationText(each.near) : '–', serving ? durationText(each.stronger) : '–',
                 remarks.filter((remark) => remark).join(' · ')];

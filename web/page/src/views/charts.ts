@@ -9,7 +9,7 @@ import type { Model } from '../model.js';
 import type { Border } from '../source.js';
 
 /** Beside the plots, so that lanes can stand below them. */
-export const gutter = { left: 72, right: 24 };
+export const gutter = { left: 72, right: 32 };
 const plotHeight = 150;
 
 export interface CurveOf {
@@ -48,7 +48,7 @@ function drawBands(chart: uPlot, of: ChartOf): void {
     }
 }
 
-function optionsOf(of: ChartOf, width: number, model: Model, busy: { isSetting: boolean }): uPlot.Options {
+function optionsOf(of: ChartOf, width: number, model: Model): uPlot.Options {
     const axis = { stroke: () => styleColour('ink'), grid: { stroke: () => styleColour('line'), width: 1 },
         ticks: { stroke: () => styleColour('line'), width: 1 }, font: '12px system-ui, sans-serif' };
     return {
@@ -72,10 +72,6 @@ function optionsOf(of: ChartOf, width: number, model: Model, busy: { isSetting: 
                 if (size > 0) model.show(chart.posToVal(left, 'x'), chart.posToVal(left + size, 'x'));
                 chart.setSelect({ left: 0, top: 0, width: 0, height: 0 }, false);
             }],
-            setCursor: [(chart) => {
-                const left = chart.cursor.left ?? -1;
-                if (left >= 0 && !busy.isSetting) model.look(chart.posToVal(left, 'x'));
-            }],
         },
     };
 }
@@ -84,7 +80,6 @@ function optionsOf(of: ChartOf, width: number, model: Model, busy: { isSetting: 
 export class Charts {
     readonly element = h('div', { class: 'charts' });
     private charts: { plot: uPlot; of: ChartOf; readings: HTMLElement[] }[] = [];
-    private readonly busy = { isSetting: false };
     private loading = 0;
 
     constructor(private readonly model: Model, private readonly chartsOf: () => ChartOf[]) {
@@ -110,7 +105,10 @@ export class Charts {
             const place = h('div', { class: 'plot', 'aria-hidden': 'true' });
             this.element.append(h('figure', {}, h('figcaption', {}, h('span', { class: 'chart-title' },
                 `${of.title}${of.unit && `, ${of.unit}`}`), legend, h('span', { class: 'quiet' }, bandWords(of.borders))), place));
-            return { plot: new uPlot(optionsOf(of, width, this.model, this.busy), [[]], place), of, readings };
+            const plot = new uPlot(optionsOf(of, width, this.model), [[]], place);
+            // Not the plot's own hook: that also tells where its cursor comes to stand after a zoom.
+            plot.over.addEventListener('mousemove', (event) => this.model.look(plot.posToVal(event.offsetX, 'x')));
+            return { plot, of, readings };
         });
         return this.load();
     }
@@ -124,34 +122,29 @@ export class Charts {
         const turn = ++this.loading;
         const ids = this.charts.flatMap((chart) => chart.of.curves.map((curve) => curve.id));
         const drawn = await this.model.source.series(ids, this.model.from, this.model.to,
-            2 * Math.max(this.element.clientWidth, 240));
+            2 * Math.max(this.element.clientWidth, 240), this.model.stretch);
         if (turn !== this.loading) return; // a later part was asked for
-        this.busy.isSetting = true;
         let next = 0;
         for (const { plot, of } of this.charts) {
             const values = of.curves.map(() => drawn.values[next++]!);
             plot.setData([drawn.times, ...values]);
         }
-        this.busy.isSetting = false;
         this.setCursor();
     }
 
     private setCursor(): void {
-        if (this.busy.isSetting) return;
-        this.busy.isSetting = true;
         for (const { plot } of this.charts) {
             const left = plot.valToPos(this.model.cursor, 'x');
             if (Math.abs((plot.cursor.left ?? -10) - left) > 0.5) plot.setCursor({ left, top: -10 }, false);
         }
-        this.busy.isSetting = false;
         void this.read();
     }
 
     /** The values at the cursor: what is drawn may stand for several ticks. */
     private async read(): Promise<void> {
-        const { cursor } = this.model;
+        const { cursor, stretch } = this.model;
         const ids = this.charts.flatMap((chart) => chart.of.curves.map((curve) => curve.id));
-        const { values } = await this.model.source.series(ids, cursor - hole, cursor, 4 * hole);
+        const { values } = await this.model.source.series(ids, cursor - hole, cursor, 4 * hole, stretch);
         if (cursor !== this.model.cursor || values.length !== this.charts.flatMap((chart) => chart.readings).length) return;
         let next = 0;
         for (const { of, readings } of this.charts) {

@@ -27,7 +27,7 @@ export function compareView(before: Model, after: Model): HTMLElement {
         if (!match) continue;
         void Promise.all([allOf(before, measure), allOf(after, match)]).then(([first, second]) => {
             place.replaceChildren(distributionChart(measureName(measure, one.measures), measure.unit, [
-                distributionOf(first, first.values[0]!, 'before'), distributionOf(second, second.values[0]!, 'after')]));
+                distributionOf(first, 'before'), distributionOf(second, 'after')]));
         });
     }
     return section('compare', 'Before and after', h('p', {}, names.join(' · ')),

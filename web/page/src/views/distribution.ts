@@ -8,19 +8,22 @@ import type { Drawn, Measure } from '../source.js';
 
 const [width, height, left, bottom] = [460, 200, 40, 28];
 
+const byNumber = new Intl.Collator('en', { numeric: true });
+
 /** One recording's values of a measure. */
 export interface Distribution {
     label: string;
     bins: Bin[];
 }
 
-/** Every reading of a measure: no more points than a day has ticks. */
-export function allOf(model: Model, measure: Measure): Promise<Drawn> {
-    return model.source.series([measure.id], -Infinity, Infinity, 2_000_000);
+/** Every reading of a measure, in each stretch: no more points than a day has ticks. */
+export function allOf(model: Model, measure: Measure): Promise<Drawn[]> {
+    const stretches = model.source.isLive ? [model.stretch] : model.figures.head.stretches.map((_, i) => i);
+    return Promise.all(stretches.map((stretch) => model.source.series([measure.id], -Infinity, Infinity, 2_000_000, stretch)));
 }
 
-export function distributionOf(drawn: Drawn, values: (number | null)[], label: string): Distribution {
-    return { label, bins: histogramOf(drawn.times, values, hole) };
+export function distributionOf(pieces: readonly Drawn[], label: string): Distribution {
+    return { label, bins: histogramOf(pieces, hole) };
 }
 
 /** Histograms as bars, cumulative curves as lines; several lie over each other. */
@@ -78,7 +81,7 @@ export function distributionView(model: Model): HTMLElement {
     const choice = h('select', { 'aria-label': 'Cell' });
     const place = h('div', { class: 'small-charts' });
     const fill = (): void => {
-        const cells = [...new Set(model.figures.cells.map((stay) => stay.cell))].sort((a, b) => a.localeCompare(b, 'en', { numeric: true }));
+        const cells = [...new Set(model.figures.cells.map((stay) => stay.cell))].sort(byNumber.compare);
         const chosen = choice.value;
         choice.replaceChildren(h('option', { value: '' }, `all cells (${counted(cells.length, 'cell')})`),
             ...cells.map((cell) => h('option', { value: cell }, cell)));
@@ -87,9 +90,10 @@ export function distributionView(model: Model): HTMLElement {
     const draw = async (): Promise<void> => {
         const { measures, cells } = model.figures;
         const charts = await Promise.all(measures.map(async (measure) => {
-            const drawn = await allOf(model, measure);
-            const values = choice.value ? inCell(drawn, 0, cells, choice.value) : drawn.values[0]!;
-            return distributionChart(measureName(measure, measures), measure.unit, [distributionOf(drawn, values, '')]);
+            const all = await allOf(model, measure);
+            const pieces = choice.value === '' ? all
+                : all.map((piece, i) => inCell(piece, cells.filter((stay) => model.source.isLive || stay.stretch === i), choice.value));
+            return distributionChart(measureName(measure, measures), measure.unit, [distributionOf(pieces, '')]);
         }));
         place.replaceChildren(...charts);
     };

@@ -22,7 +22,7 @@ export function eventsView(model: Model): HTMLElement {
             `${event.kind} ${event.words}`.toLowerCase().includes(wanted));
         count.textContent = found.length > most ? `the first ${most} of ${counted(found.length, 'event')}` : counted(found.length, 'event');
         list.replaceChildren(...found.slice(0, most).map((event) => h('li', {},
-            button(timeText(event.time), `Look at ${timeText(event.time)}`, () => model.goTo(event.time)),
+            button(timeText(event.time), `Look at ${timeText(event.time)}`, () => model.goTo(event.time, event.time, event.stretch)),
             h('span', { class: 'kind' }, event.kind), h('span', {}, event.words))));
     };
     fill();

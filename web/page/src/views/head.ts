@@ -1,5 +1,5 @@
 import { h } from '../dom.js';
-import { counted, durationText, timeText, titleOf } from '../logic/text.js';
+import { counted, durationText, limitsOf, timeText, titleOf } from '../logic/text.js';
 import type { Model } from '../model.js';
 
 export function headView(model: Model): HTMLElement {
@@ -7,7 +7,9 @@ export function headView(model: Model): HTMLElement {
     const draw = (): void => {
         const { head, cells } = model.figures;
         const served = new Set(cells.map((stay) => `${stay.system} ${stay.cell}`)).size;
-        const facts = [durationText(head.to - head.from + head.interval), counted(head.packets, 'packet'),
+        const seconds = head.stretches.reduce((sum, each) => sum + each.to - each.from + head.interval, 0);
+        const [from, to] = limitsOf(head);
+        const facts = [durationText(seconds), counted(head.packets, 'packet'),
             counted(served, 'serving cell'), counted(head.cellChanges, 'cell change'),
             counted(head.pingPongs, 'ping-pong'), head.gaps ? counted(head.gaps, 'gap') : 'no gaps',
             head.timeSteps ? counted(head.timeSteps, 'time step') : 'no time steps'];
@@ -17,8 +19,8 @@ export function headView(model: Model): HTMLElement {
         document.title = titleOf(head);
         place.replaceChildren(
             h('h1', {}, titleOf(head)),
-            h('p', { class: 'lead' }, [head.technology, head.operator, head.recording].filter((text) => text).join(' · ')),
-            h('p', {}, `${timeText(head.from)} to ${timeText(head.to)} UTC · ${facts.join(' · ')}`),
+            h('p', { class: 'lead' }, [head.label, head.technology, head.operator, head.recording].filter((text) => text).join(' · ')),
+            h('p', {}, `${timeText(from)} to ${timeText(to)} UTC · ${facts.join(' · ')}`),
             h('p', { class: 'quiet' }, `Made by pallax ${head.version}. `, people,
                 head.where ? ` Only ticks for which this holds: ${head.where}` : ''),
             ...head.notes.map((note) => h('p', { class: 'note' }, note)));

@@ -61,7 +61,7 @@ function drawSpans(canvas: HTMLCanvasElement, model: Model, spans: readonly Lane
     if (cursor >= 0 && cursor <= width) context.fillRect(cursor - 0.5, 0, 1, height);
 }
 
-/** A lane with its name; `spansOf` gives its content anew when the data change. */
+/** A lane with its name; `spansOf` gives its content anew when the data or the stretch change. */
 export function laneView(model: Model, name: string, spansOf: () => LaneSpan[], isPoint = false): HTMLElement {
     const canvas = h('canvas', { 'aria-hidden': 'true', height });
     const label = h('span', { class: 'lane-name', title: name }, name);
@@ -70,10 +70,12 @@ export function laneView(model: Model, name: string, spansOf: () => LaneSpan[], 
     let spans = spansOf();
     const draw = (): void => drawSpans(canvas, model, spans, isPoint);
     for (const part of ['window', 'cursor', 'look'] as const) model.on(part, draw);
-    model.on('data', () => {
-        spans = spansOf();
-        draw();
-    });
+    for (const part of ['data', 'stretch'] as const) {
+        model.on(part, () => {
+            spans = spansOf();
+            draw();
+        });
+    }
     const timeAt = (event: MouseEvent): number =>
         model.from + (event.offsetX / canvas.clientWidth) * (model.to - model.from);
     canvas.addEventListener('mousemove', (event) => {

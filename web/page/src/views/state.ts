@@ -16,7 +16,7 @@ export function stateView(model: Model): HTMLElement {
     let wanted = NaN;
     const draw = async (): Promise<void> => {
         const time = (wanted = model.cursor);
-        const state = await model.source.stateAt(time);
+        const state = await model.source.stateAt(time, model.stretch);
         if (wanted !== time) return; // a later one was asked for
         const rows: HTMLElement[] = [];
         let section = '';

@@ -1,12 +1,11 @@
 import { seriesColour, styleColour } from '../colours.js';
 import { button, h, section } from '../dom.js';
-import { clockText, measureName } from '../logic/text.js';
+import { chartedNeighbours } from '../logic/neighbours.js';
+import { clockText, durationText, measureName, timeText } from '../logic/text.js';
 import type { Model } from '../model.js';
-import type { Figures, Lane } from '../source.js';
+import type { EventRow, Figures, Lane } from '../source.js';
 import { type ChartOf, Charts } from './charts.js';
 import { laneView, type LaneSpan } from './lanes.js';
-
-const mostNeighbours = 6;
 
 /** The levels of the serving cell, and those of the neighbours that come closest to them. */
 function chartsOf(figures: Figures): ChartOf[] {
@@ -17,22 +16,19 @@ function chartsOf(figures: Figures): ChartOf[] {
         borders: measure.borders,
         curves: [{ label: 'serving cell', colour: seriesColour(0), id: measure.id, isBold: true }],
     }));
-    const kinds = new Set(figures.neighbours.filter((each) => each.seconds > 0)
-        .map((each) => `${each.system}\n${each.measure}\n${each.unit}`));
-    for (const kind of kinds) {
-        const [system, measure, unit] = kind.split('\n') as [string, string, string];
-        const own = figures.neighbours.filter((each) => each.seconds > 0 && each.system === system &&
-            each.measure === measure && each.unit === unit);
+    const groups = chartedNeighbours(figures.neighbours);
+    for (const group of groups) {
+        const { system, measure, unit } = group[0]!;
         const serving = figures.measures.find((each) => each.system === system && each.measure === measure && measure);
-        const levels = own.flatMap((each) => [each.best ?? 0, each.median ?? 0]);
+        const levels = group.flatMap((each) => [each.best ?? 0, each.median ?? 0]);
         charts.push({
-            title: `Neighbours${kinds.size > 1 ? `, ${system}` : ''}: ${serving?.name ?? 'level'}`,
+            title: `Neighbours${groups.length > 1 ? `, ${system}` : ''}: ${serving?.name ?? 'level'}`,
             unit,
             range: serving ? [serving.worst, serving.best] : [Math.min(...levels) - 10, Math.max(...levels) + 5],
             borders: [],
             curves: [
                 ...(serving ? [{ label: 'serving', colour: styleColour('ink'), id: serving.id, isBold: true }] : []),
-                ...own.slice(0, mostNeighbours).map((each, i) => ({ label: each.cell, colour: seriesColour(i), id: each.id })),
+                ...group.map((each, i) => ({ label: each.cell, colour: seriesColour(i), id: each.id })),
             ],
         });
     }
@@ -41,29 +37,29 @@ function chartsOf(figures: Figures): ChartOf[] {
 
 const important = new Set(['service-lost', 'fatal-record', 'ping-pong', 'gap', 'time-step', 'alarm']);
 
-function eventSpans(figures: Figures): LaneSpan[] {
-    const spans = figures.events.map((event) => ({ from: event.time, to: event.time,
+function eventSpans(events: readonly EventRow[]): LaneSpan[] {
+    const spans = events.map((event) => ({ from: event.time, to: event.time,
         text: `${clockText(event.time)} ${event.kind}: ${event.words}`,
         colour: important.has(event.kind) ? seriesColour(1) : seriesColour(6) }));
     return spans.sort((a, b) => (a.colour < b.colour ? 1 : a.colour > b.colour ? -1 : a.from - b.from)); // those that matter on top
 }
 
-function spansOfLane(lane: Lane | undefined, from: number): LaneSpan[] {
+function spansOfLane(model: Model, lane: Lane | undefined, from: number): LaneSpan[] {
     const texts = [...new Set(lane?.spans.map((span) => span.text))];
-    return (lane?.spans ?? []).map((span) => ({ ...span, colour: seriesColour(from + texts.indexOf(span.text)) }));
+    return model.inStretch(lane?.spans ?? []).map((span) => ({ ...span, colour: seriesColour(from + texts.indexOf(span.text)) }));
 }
 
 function lanesOf(model: Model): HTMLElement[] {
     const { figures } = model;
     const systems = [...new Set(figures.cells.map((stay) => stay.system))];
     const cells = systems.map((system) => laneView(model, systems.length > 1 ? `${system} cells` : 'Cells', () =>
-        model.figures.cells.filter((stay) => stay.system === system).map((stay) => ({ from: stay.from, to: stay.to,
+        model.inStretch(model.figures.cells).filter((stay) => stay.system === system).map((stay) => ({ from: stay.from, to: stay.to,
             text: stay.cell.replace(/^\S+ (?=\S+$)/, ''), colour: model.colours.of(stay.cell), isMarked: stay.pingPong }))));
     const states = figures.states.map((lane, i) => laneView(model, lane.name,
-        () => spansOfLane(model.figures.states[i], 0)));
+        () => spansOfLane(model, model.figures.states[i], 0)));
     const contexts = figures.contexts.map((lane, i) => laneView(model, contextName(lane.name, i),
-        () => spansOfLane(model.figures.contexts[i], 2)));
-    return [...cells, ...states, ...contexts, laneView(model, 'Events', () => eventSpans(model.figures), true)];
+        () => spansOfLane(model, model.figures.contexts[i], 2)));
+    return [...cells, ...states, ...contexts, laneView(model, 'Events', () => eventSpans(model.inStretch(model.figures.events)), true)];
 }
 
 /** The name of a context is masked with the rest of it. */
@@ -84,6 +80,27 @@ function keysOf(model: Model): Record<string, () => void> {
         '-': () => model.zoom(2),
         '0': () => model.showAll(),
     };
+}
+
+/** Chooses the shown stretch where the clock was set back; nothing where it never was. */
+function stretchChooser(model: Model): HTMLElement {
+    const choice = h('select', { 'aria-label': 'Stretch of time' });
+    const told = h('span');
+    const place = h('p', { class: 'note' }, 'The clock was set back. Show ', choice, ' ', told);
+    const draw = (): void => {
+        const { stretches } = model.figures.head;
+        place.hidden = stretches.length < 2;
+        choice.replaceChildren(...stretches.map((each, i) => h('option', { value: i },
+            `${i + 1} of ${stretches.length}: ${timeText(each.from)} to ${timeText(each.to)}`)));
+        choice.value = String(model.stretch);
+        const [before, shown] = [stretches[model.stretch - 1], stretches[model.stretch]];
+        told.textContent = before && shown ? `It begins ${durationText(before.to - shown.from)} before the end of stretch ${model.stretch}.` : '';
+    };
+    choice.addEventListener('change', () => model.choose(Number(choice.value)));
+    model.on('data', draw);
+    model.on('stretch', draw);
+    draw();
+    return place;
 }
 
 /** The curves and lanes; `start` draws them once they are in the document. */
@@ -113,7 +130,7 @@ export function timelineView(model: Model): { element: HTMLElement; start: () =>
     return {
         element: section('time', 'Over time', h('p', { class: 'quiet' },
             'Drag to zoom, double-click to show all. With the keyboard: ← → one tick, Page Up and Page Down a minute, + − zoom, 0 all.'),
-        tools, area),
+        stretchChooser(model), tools, area),
         start: async () => {
             await charts.make();
             model.tell('cursor'); // the lanes have their width now

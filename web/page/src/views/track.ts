@@ -17,6 +17,15 @@ function shadeOf(value: number, measure: Measure): string {
     return shades[Math.min(Math.max(Math.floor(share * shades.length), 0), shades.length - 1)]!;
 }
 
+/** The shown stretch if it has that time, or else the first that has it. */
+function stretchAt(model: Model, time: number): number {
+    const has = ({ from, to }: { from: number; to: number }): boolean => from <= time && time <= to;
+    const { stretches } = model.figures.head;
+    const shown = stretches[model.stretch];
+    const found = stretches.findIndex(has);
+    return (shown && has(shown)) || found < 0 ? model.stretch : found;
+}
+
 /** The way of the drive, coloured by a measure, without a map. */
 export function trackView(model: Model, track: readonly TrackPoint[]): HTMLElement {
     const { points, width, height } = placedOf(track);
@@ -31,17 +40,17 @@ export function trackView(model: Model, track: readonly TrackPoint[]): HTMLEleme
     const legend = h('p', { class: 'quiet' });
     const draw = async (): Promise<void> => {
         const measure = model.figures.measures.find((each) => String(each.id) === choice.value);
-        const drawn: Drawn = measure ? await allOf(model, measure) : { times: [], values: [[]] };
+        const pieces: Drawn[] = measure ? await allOf(model, measure) : [];
         lines.replaceChildren();
         for (let i = 1; i < points.length; ++i) {
             const [one, other] = [points[i - 1]!, points[i]!];
-            const value = measure ? valueNear(drawn, 0, one.time) : null;
+            const value = pieces.map((piece) => valueNear(piece, 0, one.time)).find((each) => each !== null) ?? null;
             const line = svg('line', { x1: x(one.x), y1: y(one.y), x2: x(other.x), y2: y(other.y), 'stroke-width': 5,
                 'stroke-linecap': 'round', stroke: value === null ? seriesColour(6) : shadeOf(value, measure!),
                 'stroke-opacity': value === null ? 0.4 : 1 });
             const grade = value === null || !measure ? '' : gradeOf(value, measure.borders);
             line.append(svg('title', {}, `${timeText(one.time)}${value === null ? '' : `  ${levelText(value, measure!.unit)} ${grade}`}`));
-            line.addEventListener('click', () => model.goTo(one.time));
+            line.addEventListener('click', () => model.goTo(one.time, one.time, stretchAt(model, one.time)));
             lines.append(line);
         }
         legend.textContent = measure ? `Dark is ${levelText(measure.worst, measure.unit)}, light is ${levelText(measure.best, measure.unit)}; grey was not measured.` : '';

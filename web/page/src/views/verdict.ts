@@ -23,7 +23,7 @@ function rowOf(model: Model, measure: Measure): Cell[] {
     const link = worst
         ? button(`${clockText(worst.from)}, mean ${levelText(worst.mean, measure.unit)}`,
             `Show the worst minute of ${measure.name}, ${clockText(worst.from)}`,
-            () => model.goTo(worst.from, worst.to))
+            () => model.goTo(worst.from, worst.to, worst.stretch))
         : h('span', { class: 'quiet' }, 'less than a minute');
     return [name, shareBar(measure), q ? `${q.p5} · ${q.p50} · ${q.p95} ${measure.unit}` : '–',
         q ? `${q.least} to ${q.most} ${measure.unit}` : '–', durationText(measure.seconds), link];
