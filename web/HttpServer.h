@@ -27,7 +27,7 @@ public:
         std::size_t requestBytes = 16384;          ///< request line and headers
         std::chrono::milliseconds request{5000};   ///< from the connection to the whole request
         std::chrono::milliseconds response{30000}; ///< for all of a response but an event stream
-        /// So much of an event stream waits for a slow client.
+        /// So much of an event stream waits behind what a slow client is taking.
         std::size_t waitingBytes = std::size_t{1} << 20U;
         /// A stream without events says that it lives, which also finds clients that have left.
         std::chrono::milliseconds heartbeat{5000};

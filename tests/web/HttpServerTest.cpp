@@ -181,6 +181,15 @@ TEST_F(HttpServerTest, ASlowClientOfAStreamIsCutOffAndNobodyElse) {
     EXPECT_NE(quick.receive("data: last\n\n").find("data: last"), std::string::npos);
 }
 
+TEST_F(HttpServerTest, AStreamBeginsWithATextOfAnySize) {
+    start({.waitingBytes = 1000});
+    HttpClient browser = stream("data: " + std::string(5'000'000, 'z') + "\n\n");
+    (void)browser.isClosedWithin(100ms); // it is being sent
+    publish("data: next\n\n");
+    EXPECT_GT(browser.receive("data: next\n\n").size(), 5'000'000U);
+    EXPECT_EQ(server->streams(), 1U);
+}
+
 TEST_F(HttpServerTest, ClientsBeyondTheLimitWaitForThoseThatLeave) {
     start({.connections = 2, .heartbeat = 100ms});
     auto first = std::make_unique<HttpClient>(stream());

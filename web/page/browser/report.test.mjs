@@ -1,7 +1,7 @@
 import assert from 'node:assert/strict';
 import { statSync, writeFileSync } from 'node:fs';
 import { after, before, test } from 'node:test';
-import { assertClean, file, launch, leavesOf, open, pallax, randomNumbers, report, seriousFindings, shownState } from './page.mjs';
+import { assertClean, file, launch, leavesOf, open, pallax, randomNumbers, report, seriousFindings, shownState, writeMessage } from './page.mjs';
 
 let browser;
 let hour;
@@ -112,22 +112,6 @@ test('events are filtered by kind and words, and lead to their instant', async (
     assert.equal(await page.evaluate(() => globalThis.pallaxModels[0].cursor), events.find((event) => event.kind === 'ping-pong').time);
     await page.context().close();
 });
-
-/** A recording of one message of the object stream, as XML. */
-function writeMessage(name, xml) {
-    const bytes = Buffer.from(`<?xml version="1.0"?><plist version="1.0">${xml}</plist>`);
-    const head = Buffer.alloc(24 + 16);
-    head.writeUInt32LE(0xa1b2c3d4, 0);
-    head.writeUInt16LE(2, 4);
-    head.writeUInt16LE(4, 6);
-    head.writeUInt32LE(65535, 16);
-    head.writeUInt32LE(147, 20);
-    head.writeUInt32LE(1700000000, 24);
-    head.writeUInt32LE(bytes.length, 32);
-    head.writeUInt32LE(bytes.length, 36);
-    writeFileSync(file(name), Buffer.concat([head, bytes]));
-    return file(name);
-}
 
 test('texts of a modem that look like markup are shown as texts', async () => {
     const evil = '<script>alert(1)</script><img src=x onerror=alert(2)>';

@@ -2,7 +2,7 @@
 import { CellColours } from './colours.js';
 import type { Figures, Seconds, Source } from './source.js';
 
-export type Part = 'data' | 'window' | 'cursor' | 'look';
+export type Part = 'data' | 'window' | 'cursor' | 'look' | 'hold';
 type Listener = () => void;
 
 const leastWindow = 4;
@@ -12,6 +12,9 @@ export class Model {
     to: Seconds;
     cursor: Seconds;
     colours: CellColours;
+    /** Of a live modem: a page that looks back stays as it is until it follows again. */
+    isFollowing = true;
+    private held: Figures | null = null;
     private readonly listeners: [Part, Listener][] = [];
 
     constructor(
@@ -39,8 +42,13 @@ export class Model {
     }
 
     update(figures: Figures): void {
+        if (!this.isFollowing) {
+            this.held = figures;
+            this.tell('hold');
+            return;
+        }
         const [from, to] = this.whole();
-        const [atFrom, atEnd, atCursor] = [this.from <= from, this.to >= to, this.cursor >= to];
+        const [atFrom, atEnd] = [this.from <= from, this.to >= to];
         this.figures = figures;
         this.colours = new CellColours(figures.cells.map((stay) => stay.cell));
         const [newFrom, end] = this.whole();
@@ -50,7 +58,30 @@ export class Model {
         }
         this.tell('data');
         if (atEnd) this.tell('window');
-        if (atCursor) this.look(end);
+        this.look(end);
+    }
+
+    /** The ticks that have come since the page is held. */
+    newTicks(): number {
+        return this.held === null ? 0 : Math.max(this.held.head.ticks - this.figures.head.ticks, 0);
+    }
+
+    hold(): void {
+        this.setFollowing(false);
+    }
+
+    follow(): void {
+        this.setFollowing(true);
+        const { held } = this;
+        this.held = null;
+        if (held === null) this.look(this.whole()[1]);
+        else this.update(held);
+    }
+
+    private setFollowing(isFollowing: boolean): void {
+        if (isFollowing === this.isFollowing || !this.source.isLive) return;
+        this.isFollowing = isFollowing;
+        this.tell('hold');
     }
 
     /** Shows a part of the time. */
@@ -81,6 +112,8 @@ export class Model {
     look(time: Seconds): void {
         const [first, last] = this.whole();
         this.cursor = Math.min(Math.max(time, first), last);
+        if (this.cursor < last) this.hold();
+        else if (!this.isFollowing) this.follow();
         this.tell('cursor');
     }
 
