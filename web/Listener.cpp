@@ -37,8 +37,9 @@ Result<Listener, HostError> Listener::at(const std::string& address, std::uint16
         ::socket(wanted->family(), SOCK_STREAM | SOCK_NONBLOCK | SOCK_CLOEXEC, IPPROTO_TCP));
     if (!socket || !listenOn(socket.number(), *wanted)) {
         const int error = errno;
-        return HostError{formatText("Cannot listen on port %u of %@: %s.",
-                                    {unsigned{port}, address, std::strerror(error)})};
+        const std::string place =
+            port != 0 ? formatText("port %u of %@", {unsigned{port}, address}) : address;
+        return HostError{formatText("Cannot listen on %@: %s.", {place, std::strerror(error)})};
     }
     const InternetAddress own = InternetAddress::ofSocket(socket.number());
     return Listener{std::move(socket), address, own.port(), own.isLoopback()};
