@@ -12,8 +12,6 @@ namespace pallax {
 
 namespace {
 
-constexpr int kBacklog = 64;
-
 /// Binds and listens; false with errno set.
 bool listenOn(int socket, const InternetAddress& address) {
     const int yes = 1;
@@ -23,7 +21,7 @@ bool listenOn(int socket, const InternetAddress& address) {
            (address.family() != AF_INET6 ||
             ::setsockopt(socket, IPPROTO_IPV6, IPV6_V6ONLY, &yes, sizeof yes) == 0) &&
            ::bind(socket, address.generic(), address.size()) == 0 &&
-           ::listen(socket, kBacklog) == 0;
+           ::listen(socket, SOMAXCONN) == 0;
 }
 
 } // namespace
