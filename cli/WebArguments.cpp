@@ -2,6 +2,7 @@
 
 #include "cli/OptionParts.h"
 #include "cli/SimulateOptions.h"
+#include "web/InternetAddress.h"
 
 #include <CLI/CLI.hpp>
 
@@ -52,7 +53,7 @@ CLI::App& addDemo(CLI::App& app, WebOptions& options) {
     CLI::App& demo = *app.add_subcommand("demo", "A simulated modem");
     demo.group("")->fallthrough();
     const auto take = [&options](const std::string& name) {
-        std::get<SimulationOptions>(options.source).technology =
+        options.source.emplace<SimulationOptions>().technology =
             simulatedTechnologyNamed("TECHNOLOGY", name);
     };
     demo.preparse_callback([&options](std::size_t /*words*/) {
@@ -73,9 +74,16 @@ void addListening(CLI::App& app, WebOptions& options) {
            },
            "Listen on this port (default: one that is free)")
         ->type_name("N");
-    app.add_option("--listen", options.address,
-                   "Listen on this address of the machine, for others of the network (default: "
-                   "127.0.0.1)")
+    app.add_option_function<std::string>(
+           "--listen",
+           [&options](const std::string& text) {
+               if (!InternetAddress::parse(text, 0)) {
+                   throw CLI::ValidationError(
+                       "--listen", '"' + text + "\" is no address of the form 127.0.0.1 or ::1");
+               }
+               options.address = text;
+           },
+           "Listen on this address of the machine, for others of the network (default: 127.0.0.1)")
         ->type_name("ADDRESS");
     CLI::Option* certificate =
         app.add_option("--certificate", options.certificate, "Encrypt with this certificate (PEM)")
@@ -100,14 +108,13 @@ void addWeb(CLI::App& app, WebOptions& options) {
                "The recording (pcap or pcapng; - is standard input) or its numbered parts, or "
                "demo [TECHNOLOGY] for a simulated modem (default: the live modem)")
             ->type_name("");
-    app.add_option_function<std::string>(
-           "--connect",
-           [&options](const std::string& name) {
-               options.source = ServiceModem{serviceNameOf("--connect", name)};
-           },
-           "The live modem of the service that has this name")
-        ->excludes(source)
-        ->type_name("NAME");
+    CLI::Option* connect = app.add_option_function<std::string>(
+        "--connect",
+        [&options](const std::string& name) {
+            options.source = ServiceModem{serviceNameOf("--connect", name)};
+        },
+        "The live modem of the service that has this name");
+    connect->excludes(source)->type_name("NAME");
     addListening(app, options);
     app.add_flag("--open", options.open, "Open the page in the browser (xdg-open)");
     app.add_option("--profile", options.profile,
@@ -117,9 +124,9 @@ void addWeb(CLI::App& app, WebOptions& options) {
                  "Do not mask what identifies a person");
     CLI::Option* speed = addSpeed(app, options.play);
     CLI::App& demo = addDemo(app, options);
-    app.callback([&demo, source, speed] {
-        if (demo.parsed() && !source->empty()) {
-            throw CLI::ValidationError("demo", "it is shown alone, without a recording");
+    app.callback([&demo, source, connect, speed] {
+        if (demo.parsed() && !(source->empty() && connect->empty())) {
+            throw CLI::ValidationError("demo", "it is shown alone, without another source");
         }
         if (!demo.parsed() && source->empty() && !speed->empty()) {
             throw CLI::ValidationError("--speed", "only a recording or a demo has a speed");

@@ -36,6 +36,8 @@ public:
             &_timeline.fields());
     }
 
+    Timeline& timeline() { return _timeline; }
+
     Database database;
 
 private:

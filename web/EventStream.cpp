@@ -6,15 +6,19 @@
 namespace pallax {
 
 bool EventStream::add(const std::shared_ptr<const std::string>& text) {
-    if (_hasEnded || _bytes + text->size() > _mostWaiting) {
+    if (_hasEnded) {
+        return false;
+    }
+    if (text->empty()) {
+        return true;
+    }
+    _bytes += _waiting.empty() ? 0 : text->size();
+    if (_bytes > _mostWaiting) {
         end();
         return false;
     }
-    if (!text->empty()) {
-        _waiting.push_back(text);
-        _bytes += text->size();
-        resume();
-    }
+    _waiting.push_back(text);
+    resume();
     return true;
 }
 
@@ -43,10 +47,10 @@ ssize_t EventStream::read(std::span<char> to) {
     const std::size_t count = std::min(to.size(), text.size() - _taken);
     std::copy_n(text.data() + _taken, count, to.data());
     _taken += count;
-    _bytes -= count;
     if (_taken == text.size()) {
         _waiting.pop_front();
         _taken = 0;
+        _bytes -= _waiting.empty() ? 0 : _waiting.front()->size();
     }
     return static_cast<ssize_t>(count);
 }

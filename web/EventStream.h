@@ -11,8 +11,9 @@ struct MHD_Connection;
 
 namespace pallax {
 
-/// The server-sent events for one client, of which a limited amount waits until the client takes
-/// it. The texts are shared by all streams. While nothing waits, the connection is suspended.
+/// The server-sent events for one client, of which a limited amount waits behind the text that the
+/// client is taking; that one, such as the first, has any size. The texts are shared by all
+/// streams. While nothing waits, the connection is suspended.
 class EventStream {
 public:
     /// A comment, which clients ignore.
@@ -37,7 +38,7 @@ private:
     std::size_t _mostWaiting;
     std::deque<std::shared_ptr<const std::string>> _waiting;
     std::size_t _taken = 0; ///< of the first text
-    std::size_t _bytes = 0; ///< that wait
+    std::size_t _bytes = 0; ///< that wait behind the first text
     bool _isSuspended = false;
     bool _hasEnded = false;
 };

@@ -52,6 +52,7 @@ struct HttpServer::Impl {
         int socket;
         Steady::time_point deadline;
         std::unique_ptr<EventStream> stream = {}; ///< null unless that is the answer
+        bool hasAsked = false;                    ///< or is cut off: it holds no place for nothing
     };
 
     explicit Impl(Setup given) : setup(std::move(given)) {}
@@ -61,7 +62,9 @@ struct HttpServer::Impl {
     void runOnce();
     void wait();
     void look();
-    void cut(Client& client) const { (void)::shutdown(client.socket, SHUT_RDWR); }
+    void cut(const Client& client) const { (void)::shutdown(client.socket, SHUT_RDWR); }
+    void makeRoom();
+    std::size_t streams() const;
     void publish(const std::shared_ptr<const std::string>& text);
     ResponseOwner streamOf(MHD_Connection* connection, const WebResponse& response);
     bool answer(MHD_Connection* connection, const char* path, const char* method);
@@ -143,12 +146,15 @@ void HttpServer::Impl::wait() {
 }
 
 void HttpServer::Impl::runOnce() {
+    const bool wasFull = clients.size() >= setup.limits.connections;
     (void)MHD_run(daemon);
     if (failure != nullptr) {
         std::rethrow_exception(std::exchange(failure, nullptr));
     }
+    // Full, it does not watch its listening socket until the next run.
+    const bool hasRoomAgain = wasFull && clients.size() < setup.limits.connections;
     MHD_UNSIGNED_LONG_LONG timeout = 0;
-    if (MHD_get_timeout(daemon, &timeout) == MHD_YES && timeout == 0) {
+    if (hasRoomAgain || (MHD_get_timeout(daemon, &timeout) == MHD_YES && timeout == 0)) {
         setup.queue.async([weak = std::weak_ptr(alive)] { // it has more to do
             if (const auto self = weak.lock()) {
                 (*self)->runOnce();
@@ -165,6 +171,28 @@ void HttpServer::Impl::look() {
         }
     }
     runOnce();
+}
+
+/// Whoever connects most and asks least keeps nobody out.
+void HttpServer::Impl::makeRoom() {
+    if (clients.size() + setup.limits.spare <= setup.limits.connections) {
+        return;
+    }
+    Client* oldest = nullptr;
+    for (auto& [connection, client] : clients) {
+        const bool isOlder = oldest == nullptr || client.deadline < oldest->deadline;
+        oldest = !client.hasAsked && isOlder ? &client : oldest;
+    }
+    if (oldest != nullptr) {
+        oldest->hasAsked = true;
+        cut(*oldest);
+    }
+}
+
+std::size_t HttpServer::Impl::streams() const {
+    return static_cast<std::size_t>(
+        std::count_if(clients.begin(), clients.end(),
+                      [](const auto& each) { return each.second.stream != nullptr; }));
 }
 
 void HttpServer::Impl::publish(const std::shared_ptr<const std::string>& text) {
@@ -190,6 +218,7 @@ void HttpServer::Impl::noteConnection(void* self, MHD_Connection* connection, vo
         return;
     }
     const auto* info = MHD_get_connection_info(connection, MHD_CONNECTION_INFO_CONNECTION_FD);
+    server.makeRoom();
     server.clients[connection] = {info->connect_fd, Steady::now() + server.setup.limits.request};
 }
 
@@ -231,8 +260,12 @@ ResponseOwner responseOf(const WebResponse& response) {
 
 /// A request is answered as soon as its headers are there: it has no content.
 bool HttpServer::Impl::answer(MHD_Connection* connection, const char* path, const char* method) {
-    const WebResponse response = setup.answer(requestOf(connection, path, method));
+    WebResponse response = setup.answer(requestOf(connection, path, method));
+    if (response.isStream && streams() >= setup.limits.streams) {
+        response = textResponse(503, "Too many pages follow already.");
+    }
     Client& client = clients.at(connection);
+    client.hasAsked = true;
     client.deadline = Steady::now() + setup.limits.response;
     const ResponseOwner made =
         response.isStream ? streamOf(connection, response) : responseOf(response);
@@ -265,9 +298,7 @@ void HttpServer::publish(std::shared_ptr<const std::string> text) {
 }
 
 std::size_t HttpServer::streams() const {
-    return static_cast<std::size_t>(
-        std::count_if(_impl->clients.begin(), _impl->clients.end(),
-                      [](const auto& each) { return each.second.stream != nullptr; }));
+    return _impl->streams();
 }
 
 } // namespace pallax

@@ -21,13 +21,15 @@ class AsioMainQueue;
 class HttpServer {
 public:
     /// What no client can exceed. Header lines beyond the size are refused (431, 414); a client
-    /// that is too slow is cut off.
+    /// that is too slow is cut off, and at once where few connections are left for others.
     struct Limits {
         unsigned connections = 128;
+        unsigned spare = 16;                       ///< of these, for those that come next
+        unsigned streams = 64;                     ///< further ones are refused (503)
         std::size_t requestBytes = 16384;          ///< request line and headers
         std::chrono::milliseconds request{5000};   ///< from the connection to the whole request
         std::chrono::milliseconds response{30000}; ///< for all of a response but an event stream
-        /// So much of an event stream waits for a slow client.
+        /// So much of an event stream waits behind what a slow client is taking.
         std::size_t waitingBytes = std::size_t{1} << 20U;
         /// A stream without events says that it lives, which also finds clients that have left.
         std::chrono::milliseconds heartbeat{5000};

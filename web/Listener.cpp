@@ -12,8 +12,6 @@ namespace pallax {
 
 namespace {
 
-constexpr int kBacklog = 64;
-
 /// Binds and listens; false with errno set.
 bool listenOn(int socket, const InternetAddress& address) {
     const int yes = 1;
@@ -23,7 +21,7 @@ bool listenOn(int socket, const InternetAddress& address) {
            (address.family() != AF_INET6 ||
             ::setsockopt(socket, IPPROTO_IPV6, IPV6_V6ONLY, &yes, sizeof yes) == 0) &&
            ::bind(socket, address.generic(), address.size()) == 0 &&
-           ::listen(socket, kBacklog) == 0;
+           ::listen(socket, SOMAXCONN) == 0;
 }
 
 } // namespace
@@ -37,8 +35,9 @@ Result<Listener, HostError> Listener::at(const std::string& address, std::uint16
         ::socket(wanted->family(), SOCK_STREAM | SOCK_NONBLOCK | SOCK_CLOEXEC, IPPROTO_TCP));
     if (!socket || !listenOn(socket.number(), *wanted)) {
         const int error = errno;
-        return HostError{formatText("Cannot listen on port %u of %@: %s.",
-                                    {unsigned{port}, address, std::strerror(error)})};
+        const std::string place =
+            port != 0 ? formatText("port %u of %@", {unsigned{port}, address}) : address;
+        return HostError{formatText("Cannot listen on %@: %s.", {place, std::strerror(error)})};
     }
     const InternetAddress own = InternetAddress::ofSocket(socket.number());
     return Listener{std::move(socket), address, own.port(), own.isLoopback()};

@@ -60,10 +60,10 @@ void LiveData::take(const ShownTick& tick, const CurrentValues& values) {
     _isUpToDate = false;
 }
 
-const JsonMembers& LiveData::figures() {
+const PropertyList& LiveData::figures() {
     if (!_isUpToDate) {
         _isUpToDate = true;
-        _figures = _timeline != nullptr ? JsonMembers(gatherFigures()) : JsonMembers();
+        _figures = _timeline != nullptr ? gatherFigures() : Dictionary();
     }
     return _figures;
 }
@@ -94,16 +94,27 @@ std::string LiveData::series(const std::vector<std::uint32_t>& ids,
     return seriesJson(_report->ticks(), series, range);
 }
 
+/// The times of ticks can step back.
+const ShownTick* LiveData::tickAt(Time at) const {
+    const ShownTick* found = nullptr;
+    const auto isKept = [this](const ShownTick& tick) {
+        return _timeline->keyFrames().atOrBefore(tick.packet) != nullptr;
+    };
+    for (auto tick = _ticks.rbegin(); tick != _ticks.rend() && isKept(*tick); ++tick) {
+        found = &*tick;
+        if (tick->tick.time <= at) {
+            break;
+        }
+    }
+    return found;
+}
+
 std::optional<std::string> LiveData::state(Time at) {
-    const auto found = std::find_if(_ticks.rbegin(), _ticks.rend(),
-                                    [at](const ShownTick& tick) { return tick.tick.time <= at; });
-    if (_ticks.empty()) {
+    const ShownTick* tick = tickAt(at);
+    if (tick == nullptr) {
         return std::nullopt;
     }
-    const ShownTick& shown = found != _ticks.rend() ? *found : _ticks.front();
-    if (shown.packet < _timeline->firstInstant()) {
-        return std::nullopt;
-    }
+    const ShownTick& shown = *tick;
     if (_stateTick != shown.tick.number) {
         _state = "{\"time\":";
         appendJson(_state, PropertyList::real(pageSeconds(shown.tick.time)));

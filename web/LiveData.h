@@ -2,7 +2,6 @@
 
 #include "report/Figures.h"
 #include "report/ReportBuilder.h"
-#include "web/JsonMembers.h"
 #include "web/TickFollower.h"
 
 #include <cstdint>
@@ -42,20 +41,22 @@ public:
     /// Takes the last tick, too: no packet is about to come.
     void settle();
 
-    /// The figures (see report/Figures.h) after the ticks taken; none before the first packet.
-    const JsonMembers& figures();
+    /// The figures (see report/Figures.h) after the ticks taken; an empty object before the first
+    /// packet.
+    const PropertyList& figures();
     /// Of the measures and neighbours with these numbers (see seriesJson); those that are not known
     /// have no values.
     std::string series(const std::vector<std::uint32_t>& ids, const SeriesRange& range) const;
     /// {"time":seconds,"tick":number,"display":{…}}: the display at the latest tick at or before a
-    /// time, or else at the first one, as `decode` prints it. Nothing before the first tick, and if
-    /// the packets are gone.
+    /// time, or else at the first one whose packets are still there, as `decode` prints it. Nothing
+    /// before the first tick.
     std::optional<std::string> state(Time at);
     /// What is known about the radio after the latest packet; nothing before the first one.
     std::optional<Status> status() const;
 
 private:
     void take(const ShownTick& tick, const CurrentValues& values);
+    const ShownTick* tickAt(Time at) const;
     Dictionary gatherFigures() const;
 
     Setup _setup;
@@ -63,7 +64,7 @@ private:
     std::unique_ptr<TickFollower> _follower;
     std::unique_ptr<ReportBuilder> _report;
     std::vector<ShownTick> _ticks;
-    JsonMembers _figures;
+    PropertyList _figures;
     bool _isUpToDate = false;     ///< the figures
     std::uint64_t _stateTick = 0; ///< of `_state`; 0: none
     std::string _state;

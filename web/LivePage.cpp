@@ -2,6 +2,7 @@
 
 #include "decoding/DisplayJson.h"
 #include "report/Page.h"
+#include "web/JsonPatch.h"
 #include "web/RequestGate.h"
 #include "web/SeriesJson.h"
 
@@ -19,7 +20,10 @@ namespace pallax {
 namespace {
 
 constexpr std::size_t kMostSeries = 1024;
-constexpr std::size_t kMostPoints = 20000;
+/// Times of the page are whole milliseconds, which the real ones are rounded down to.
+constexpr std::chrono::nanoseconds kWithin =
+    std::chrono::milliseconds(1) - std::chrono::nanoseconds(1);
+constexpr std::size_t kMostPoints = 50000; // a day has 43,200 ticks
 
 WebResponse json(std::string content) {
     return {.type = "application/json",
@@ -59,7 +63,7 @@ std::optional<Time> timeOf(const WebRequest& request, std::string_view name) {
 std::optional<std::vector<std::uint32_t>> idsOf(const WebRequest& request) {
     const std::string* text = request.argument("ids");
     std::vector<std::uint32_t> ids;
-    for (std::string_view rest = text != nullptr ? *text : ""; !rest.empty();) {
+    for (std::string_view rest = text != nullptr ? *text : std::string_view(); !rest.empty();) {
         const std::string_view word = rest.substr(0, rest.find(','));
         rest.remove_prefix(std::min(word.size() + 1, rest.size()));
         const auto id = numberIn<std::uint32_t>(word);
@@ -69,6 +73,12 @@ std::optional<std::vector<std::uint32_t>> idsOf(const WebRequest& request) {
         ids.push_back(*id);
     }
     return text != nullptr ? std::optional(ids) : std::nullopt;
+}
+
+std::string jsonOf(const PropertyList& value) {
+    std::string text;
+    appendJson(text, value);
+    return text;
 }
 
 std::string eventOf(std::string_view name, std::string_view data) {
@@ -86,7 +96,7 @@ WebResponse LivePage::answer(const WebRequest& request) {
         return page();
     }
     if (request.path == "/api/figures") {
-        return json(_setup.data.figures().all());
+        return json(jsonOf(_setup.data.figures()));
     }
     if (request.path == "/api/series") {
         return series(request);
@@ -110,11 +120,19 @@ WebResponse LivePage::page() const {
                          pagePolicy(PageUse::Live) + "; frame-ancestors 'none'"}}};
 }
 
-/// Begins with all figures, so that none is missed between two requests.
+/// What the other streams have: patches go to all of them.
+const PropertyList& LivePage::toldFigures() {
+    if (_setup.counts().viewers == 0) {
+        _told = _setup.data.figures();
+    }
+    return _told;
+}
+
+/// Begins with all figures, which patches change from then on.
 WebResponse LivePage::stream() {
     return {.type = "text/event-stream",
             .content = std::make_shared<const std::string>(
-                eventOf("tick", _setup.data.figures().all()) + wordsEvent()),
+                eventOf("figures", jsonOf(toldFigures())) + wordsEvent()),
             .isStream = true};
 }
 
@@ -132,7 +150,7 @@ WebResponse LivePage::series(const WebRequest& request) const {
     if (!points || *points > kMostPoints) {
         return badArgument("points");
     }
-    return json(_setup.data.series(*ids, {*from, *to, *points}));
+    return json(_setup.data.series(*ids, {*from, *to + kWithin, *points}));
 }
 
 WebResponse LivePage::state(const WebRequest& request) const {
@@ -140,8 +158,8 @@ WebResponse LivePage::state(const WebRequest& request) const {
     if (!at) {
         return badArgument("at");
     }
-    auto state = _setup.data.state(*at);
-    return state ? json(std::move(*state)) : textResponse(404, "That time is not kept.");
+    auto state = _setup.data.state(*at + kWithin);
+    return state ? json(std::move(*state)) : textResponse(404, "Nothing has come yet.");
 }
 
 WebResponse LivePage::metrics(const WebRequest& request) const {
@@ -165,9 +183,9 @@ std::string LivePage::wordsEvent() const {
 
 std::shared_ptr<const std::string> LivePage::news() {
     std::string events;
-    const JsonMembers& figures = _setup.data.figures();
-    if (figures != _told) {
-        events += eventOf("tick", figures.changedSince(_told));
+    const PropertyList& figures = _setup.data.figures();
+    if (const std::string patch = jsonPatch(_told, figures); !patch.empty()) {
+        events += eventOf("patch", patch);
         _told = figures;
     }
     if (std::exchange(_hasNewWords, false)) {

@@ -33,13 +33,14 @@ private:
     WebResponse series(const WebRequest& request) const;
     WebResponse state(const WebRequest& request) const;
     WebResponse metrics(const WebRequest& request) const;
+    const PropertyList& toldFigures();
     std::string wordsEvent() const;
 
     Setup _setup;
     std::shared_ptr<const std::string> _page;
     std::string _words;
     bool _hasNewWords = false;
-    JsonMembers _told; ///< the figures that the streams have at least
+    PropertyList _told; ///< the figures that all streams have
 };
 
 } // namespace pallax

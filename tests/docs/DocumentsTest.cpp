@@ -38,6 +38,7 @@ constexpr auto kNotRun = std::to_array<std::string_view>({
     "pallax modem", // they need one
     "pallax service --modem",
     "pallax record --modem",
+    "ssh -L ", // it needs a port that may be taken
 });
 
 /// Commands that run until the user quits: they get Ctrl-C after two seconds and must succeed.
@@ -46,6 +47,7 @@ constexpr auto kUntilLeft = std::to_array<std::string_view>({
     "pallax demo lte --seed 7",
     "pallax demo gsm --seed 7 --speed 4",
     "pallax service --simulate lte",
+    "pallax web demo lte",
     "pallax drive.pcap",
     "pallax drive.pcap --speed 4",
     "pallax record drive.pcapng",

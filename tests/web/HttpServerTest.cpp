@@ -181,8 +181,48 @@ TEST_F(HttpServerTest, ASlowClientOfAStreamIsCutOffAndNobodyElse) {
     EXPECT_NE(quick.receive("data: last\n\n").find("data: last"), std::string::npos);
 }
 
+TEST_F(HttpServerTest, AStreamBeginsWithATextOfAnySize) {
+    start({.waitingBytes = 1000});
+    HttpClient browser = stream("data: " + std::string(5'000'000, 'z') + "\n\n");
+    (void)browser.isClosedWithin(100ms); // it is being sent
+    publish("data: next\n\n");
+    EXPECT_GT(browser.receive("data: next\n\n").size(), 5'000'000U);
+    EXPECT_EQ(server->streams(), 1U);
+}
+
+TEST_F(HttpServerTest, ClientsThatAskNothingKeepNobodyOut) {
+    start({.connections = 8, .spare = 2});
+    HttpClient follows = stream();
+    (void)follows.receive("data: 1\n\n");
+    std::vector<HttpClient> idle;
+    for (int count = 0; count < 30; ++count) {
+        idle.push_back(client());
+        idle.back().send("GET / HTTP/1.1\r\nX: ");
+        (void)queue.runReady();
+    }
+    answer = textResponse(200, "All is well.");
+    HttpClient owner = client();
+    const auto begin = std::chrono::steady_clock::now();
+    owner.send(getRequest("/", "here"));
+    EXPECT_TRUE(owner.receive().starts_with("HTTP/1.1 200 "));
+    EXPECT_LT(std::chrono::steady_clock::now() - begin, 2s) << "idle ones have five seconds";
+    EXPECT_TRUE(idle.front().isClosedWithin(1s)) << "the oldest is cut off";
+    EXPECT_EQ(server->streams(), 1U) << "an answered one stays";
+}
+
+TEST_F(HttpServerTest, StreamsLeaveConnectionsForOtherRequests) {
+    start({.streams = 2});
+    HttpClient first = stream();
+    HttpClient second = stream();
+    (void)first.receive("data: 1\n\n");
+    (void)second.receive("data: 1\n\n");
+    HttpClient third = stream();
+    EXPECT_TRUE(third.receive().starts_with("HTTP/1.1 503 ")) << third.receive();
+    EXPECT_EQ(server->streams(), 2U);
+}
+
 TEST_F(HttpServerTest, ClientsBeyondTheLimitWaitForThoseThatLeave) {
-    start({.connections = 2, .heartbeat = 100ms});
+    start({.connections = 2, .spare = 0, .heartbeat = 100ms});
     auto first = std::make_unique<HttpClient>(stream());
     HttpClient second = stream();
     (void)first->receive("data: 1\n\n");

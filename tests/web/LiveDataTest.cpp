@@ -22,6 +22,11 @@ protected:
         EXPECT_TRUE(data.follow([] { return true; }));
         data.settle();
     }
+    static json jsonOf(const PropertyList& value) {
+        std::string text;
+        appendJson(text, value);
+        return json::parse(text);
+    }
     json state(Time at) { return json::parse(*data.state(at)); }
 
     TimelineFixture recorded{"lte"};
@@ -34,7 +39,7 @@ protected:
 };
 
 TEST_F(LiveDataTest, BeforeAnyPacketThereIsNothing) {
-    EXPECT_EQ(data.figures().all(), "{}");
+    EXPECT_EQ(jsonOf(data.figures()), json::object());
     EXPECT_EQ(data.state(Time(0s)), std::nullopt);
     EXPECT_EQ(data.series({1}, {Time(0s), Time(9000s), 10}), R"({"times":[],"values":[[]]})");
     EXPECT_FALSE(data.status());
@@ -44,7 +49,7 @@ TEST_F(LiveDataTest, BeforeAnyPacketThereIsNothing) {
 TEST_F(LiveDataTest, FiguresAreThoseOfAReport) {
     const auto timeline = recorded.indexed();
     show(*timeline);
-    const json figures = json::parse(data.figures().all());
+    const json figures = jsonOf(data.figures());
     const json& head = figures["head"];
     EXPECT_EQ(head["recording"], "drive.pcap");
     EXPECT_EQ(head["technology"], "LTE");
@@ -54,23 +59,6 @@ TEST_F(LiveDataTest, FiguresAreThoseOfAReport) {
     EXPECT_EQ(head["ticks"], 30);
     EXPECT_EQ(figures["measures"][0]["name"], "RSRP");
     EXPECT_EQ(figures["events"].size(), timeline->events().size());
-}
-
-TEST_F(LiveDataTest, ChangesAreTheMembersThatATickChanges) {
-    Timeline timeline(recorded.journal, recorded.source());
-    std::uint64_t most = 1000;
-    const auto part = [&most, &timeline] { return timeline.packets() < most; };
-    (void)timeline.index(part);
-    data.begin(&timeline);
-    (void)data.follow([] { return true; });
-    const JsonMembers before = data.figures();
-    EXPECT_EQ(data.figures().changedSince(before), "{}");
-    most = 1200;
-    (void)timeline.index(part);
-    (void)data.follow([] { return true; });
-    const json changed = json::parse(data.figures().changedSince(before));
-    EXPECT_TRUE(changed.contains("head"));
-    EXPECT_TRUE(changed.contains("measures"));
 }
 
 TEST_F(LiveDataTest, StatesAreDisplaysAsDecodePrintsThem) {
@@ -90,20 +78,37 @@ TEST_F(LiveDataTest, StatesAreDisplaysAsDecodePrintsThem) {
     EXPECT_NE(state(Simulation::kStart + 9s)["display"], first["display"]);
 }
 
-TEST_F(LiveDataTest, AStateWhosePacketsAreGoneIsNotKept) {
-    recorded.journal.dropBefore(500);
-    const auto timeline = recorded.indexed();
-    show(*timeline);
-    EXPECT_TRUE(data.state(Simulation::kStart + 1h));
-    const auto early = data.state(Simulation::kStart);
-    EXPECT_TRUE(!early ||
-                json::parse(*early)["time"].get<double>() > pageSeconds(Simulation::kStart + 10s));
+TEST_F(LiveDataTest, WherePacketsAreGoneTheFirstStateThatIsKeptIsShown) {
+    Timeline timeline(recorded.journal, recorded.source(), {.keyFrames = {.distance = 100}});
+    const std::uint64_t half = recorded.journal.size() / 2;
+    (void)timeline.index([&] { return timeline.packets() < half; });
+    show(timeline);
+    EXPECT_EQ(state(Simulation::kStart)["tick"], 1);
+    recorded.journal.dropBefore(half);
+    (void)timeline.index([] { return true; });
+    (void)data.follow([] { return true; });
+    data.settle();
+    const json earliest = state(Simulation::kStart);
+    EXPECT_GT(earliest["tick"], 10);
+    EXPECT_LT(earliest["tick"], 20);
+    EXPECT_EQ(state(Simulation::kStart + 1h)["tick"], 30);
+}
+
+TEST_F(LiveDataTest, WhereNoPacketIsKeptThereIsNoState) {
+    Timeline timeline(recorded.journal, recorded.source());
+    const std::uint64_t half = recorded.journal.size() / 2;
+    (void)timeline.index([&] { return timeline.packets() < half; });
+    show(timeline);
+    recorded.journal.dropBefore(half);
+    (void)timeline.index([] { return true; });
+    EXPECT_EQ(data.state(Simulation::kStart), std::nullopt);
+    EXPECT_EQ(data.state(Simulation::kStart + 1h), std::nullopt);
 }
 
 TEST_F(LiveDataTest, SeriesAreNamedByTheFigures) {
     const auto timeline = recorded.indexed();
     show(*timeline);
-    const json figures = json::parse(data.figures().all());
+    const json figures = jsonOf(data.figures());
     const auto id = figures["measures"][0]["id"].get<std::uint32_t>();
     const json series = json::parse(data.series({id, 9999}, {Time(0s), Time(2000000000s), 1000}));
     EXPECT_EQ(series["times"].size(), 30U);
@@ -119,12 +124,12 @@ TEST_F(LiveDataTest, AnotherTimelineBeginsAnew) {
     gsm.drive(3, 10s);
     const auto other = gsm.indexed();
     show(*other);
-    const json head = json::parse(data.figures().all())["head"];
+    const json head = jsonOf(data.figures())["head"];
     EXPECT_EQ(head["technology"], "GSM/UMTS");
     EXPECT_EQ(head["ticks"], 5);
     EXPECT_TRUE(data.status());
     data.begin(nullptr);
-    EXPECT_EQ(data.figures().all(), "{}");
+    EXPECT_EQ(jsonOf(data.figures()), json::object());
 }
 
 } // namespace

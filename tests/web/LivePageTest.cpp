@@ -1,6 +1,7 @@
 #include "web/LivePage.h"
 
 #include "tests/timeline/TimelineFixture.h"
+#include "web/JsonPatch.h"
 
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
@@ -34,7 +35,8 @@ protected:
                    profile,
                    recorded.resources,
                    {.title = "", .recording = "<script>", .technology = "", .version = "1"}}};
-    LivePage page{{data, [] { return SessionCounts{.packets = 7}; }}};
+    std::size_t viewers = 0;
+    LivePage page{{data, [this] { return SessionCounts{.packets = 7, .viewers = viewers}; }}};
 };
 
 TEST_F(LivePageTest, ThePageHasAPolicyThatNoFrameAndNoForeignScriptPasses) {
@@ -74,6 +76,23 @@ TEST_F(LivePageTest, DataAreJsonWithTheTextsAsTheyAre) {
     EXPECT_EQ(json::parse(*drawn.content)["values"].size(), 2U);
 }
 
+TEST_F(LivePageTest, ATimeOfTheFiguresIsThatOfItsTick) {
+    const auto timeline = recorded.indexed();
+    show(*timeline);
+    data.settle();
+    const std::string to = json::parse(*get("/api/figures").content)["head"]["to"].dump();
+    EXPECT_EQ(json::parse(*get("/api/state", {{"at", to}}).content)["tick"], 10);
+    const WebResponse drawn = series("1", to, to, "2");
+    EXPECT_EQ(json::parse(*drawn.content)["times"].dump(), "[" + to + "]");
+}
+
+TEST_F(LivePageTest, SeveralSeriesAreAskedForAtOnce) {
+    const std::string ids = "1,2,1,5,7,3,11,6,13,1024,4294967295";
+    const WebResponse drawn = series(ids, "1700000002.006", "1700000318.006", "672");
+    EXPECT_EQ(drawn.status, 200U) << *drawn.content;
+    EXPECT_EQ(json::parse(*drawn.content)["values"].size(), 11U);
+}
+
 TEST_F(LivePageTest, AWrongArgumentIsNamed) {
     EXPECT_EQ(*get("/api/state").content, "The argument \"at\" is missing or wrong.\n");
     for (const char* at : {"", "x", "1 ", "nan", "inf", "-inf", "1e300", "0x10", "+1"}) {
@@ -86,7 +105,7 @@ TEST_F(LivePageTest, AWrongArgumentIsNamed) {
     }
     EXPECT_EQ(*series("", "x", "1", "1").content, "The argument \"from\" is missing or wrong.\n");
     EXPECT_EQ(*series("", "0", "", "1").content, "The argument \"to\" is missing or wrong.\n");
-    for (const char* points : {"", "-1", "20001", "1.5"}) {
+    for (const char* points : {"", "-1", "50001", "1.5"}) {
         EXPECT_EQ(*series("", "0", "1", points).content,
                   "The argument \"points\" is missing or wrong.\n")
             << points;
@@ -106,22 +125,40 @@ TEST_F(LivePageTest, AStreamBeginsWithEverythingAndGoesOnWithWhatChanges) {
     (void)timeline.index(part);
     show(timeline);
     page.setWords("No telephony service is running");
+    const std::string figures = *get("/api/figures").content;
     const WebResponse stream = get("/api/events");
+    const std::string begin =
+        "event: figures\ndata: " + figures +
+        "\n\nevent: words\ndata: {\"text\":\"No telephony service is running\"}\n\n";
     EXPECT_TRUE(stream.isStream);
     EXPECT_EQ(stream.type, "text/event-stream");
-    EXPECT_EQ(*stream.content,
-              "event: tick\ndata: " + data.figures().all() +
-                  "\n\nevent: words\ndata: {\"text\":\"No telephony service is running\"}\n\n");
-    EXPECT_NE(page.news(), nullptr);
+    EXPECT_EQ(*stream.content, begin);
+    viewers = 1;
+    EXPECT_NE(page.news(), nullptr) << "the words";
     EXPECT_EQ(page.news(), nullptr);
     page.setWords("");
     EXPECT_EQ(*page.news(), "event: words\ndata: {\"text\":\"\"}\n\n");
+    const PropertyList before = data.figures();
     most = 600;
     (void)timeline.index(part);
-    const JsonMembers before = data.figures();
     (void)data.follow([] { return true; });
     (void)get("/api/figures"); // takes nothing away from the streams
-    EXPECT_EQ(*page.news(), "event: tick\ndata: " + data.figures().changedSince(before) + "\n\n");
+    EXPECT_TRUE(get("/api/events").content->starts_with("event: figures\ndata: " + figures + "\n"))
+        << "what the other streams have: the same patch goes to all";
+    EXPECT_EQ(*page.news(), "event: patch\ndata: " + jsonPatch(before, data.figures()) + "\n\n");
+    EXPECT_EQ(page.news(), nullptr);
+}
+
+TEST_F(LivePageTest, TheFirstStreamBeginsWithTheLatest) {
+    Timeline timeline(recorded.journal, recorded.source());
+    (void)timeline.index([&timeline] { return timeline.packets() < 400; });
+    show(timeline);
+    (void)get("/api/events");
+    (void)timeline.index([] { return true; });
+    (void)data.follow([] { return true; });
+    EXPECT_TRUE(
+        get("/api/events")
+            .content->starts_with("event: figures\ndata: " + *get("/api/figures").content + "\n"));
     EXPECT_EQ(page.news(), nullptr);
 }
 

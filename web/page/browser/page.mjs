@@ -1,7 +1,7 @@
 // A page in Chromium, watched for anything that a clean page does not do, and what pallax makes.
 import assert from 'node:assert/strict';
-import { execFileSync } from 'node:child_process';
-import { mkdtempSync, readFileSync, rmSync } from 'node:fs';
+import { execFileSync, spawn } from 'node:child_process';
+import { mkdtempSync, readFileSync, rmSync, writeFileSync } from 'node:fs';
 import { createRequire } from 'node:module';
 import { tmpdir } from 'node:os';
 import { join } from 'node:path';
@@ -11,13 +11,74 @@ import { chromium } from 'playwright-core';
 export const folder = mkdtempSync(join(tmpdir(), 'pallax-page-'));
 process.on('exit', () => rmSync(folder, { recursive: true, force: true }));
 
+const env = { ...process.env, HOME: folder, XDG_CONFIG_HOME: folder, XDG_RUNTIME_DIR: folder, XDG_STATE_HOME: folder, TZ: 'UTC' };
+
 /** Runs pallax with a home of its own and returns what it prints. */
 export function pallax(...words) {
-    return execFileSync(process.env.PALLAX, words, { encoding: 'utf8', maxBuffer: 1 << 30,
-        env: { ...process.env, HOME: folder, XDG_CONFIG_HOME: folder, TZ: 'UTC' } });
+    return execFileSync(process.env.PALLAX, words, { encoding: 'utf8', maxBuffer: 1 << 30, env });
+}
+
+const running = new Set();
+process.on('exit', () => running.forEach((child) => child.kill('SIGKILL')));
+
+/** Starts pallax and waits until it has said this. */
+function start(words, said) {
+    const child = spawn(process.env.PALLAX, words, { env, stdio: ['ignore', 'pipe', 'pipe'] });
+    running.add(child);
+    child.on('exit', () => running.delete(child));
+    let output = '';
+    return new Promise((resolve, reject) => {
+        const look = (text) => {
+            output += text;
+            const found = said.exec(output);
+            if (found) resolve({ child, said: found[0] });
+        };
+        child.stdout.on('data', look);
+        child.stderr.on('data', look);
+        child.on('exit', () => reject(new Error(`pallax ${words.join(' ')} has ended: ${output}`)));
+    });
+}
+
+/** `pallax web` with its link. */
+export async function serve(...words) {
+    const started = await start(['web', ...words], /^http\S+/m);
+    return { ...started, link: started.said, origin: new URL(started.said).origin };
+}
+
+/** A service with a name, once it answers. */
+export async function serveService(name, ...words) {
+    const child = spawn(process.env.PALLAX, ['service', '--name', name, ...words], { env, stdio: 'ignore' });
+    running.add(child);
+    child.on('exit', () => running.delete(child));
+    while (!pallax('service', '--list').split('\n').includes(name)) await new Promise((done) => { setTimeout(done, 20); });
+    return { child };
+}
+
+/** Ends what was started, and waits for that. */
+export function ended({ child }, signal = 'SIGINT') {
+    return new Promise((resolve) => {
+        child.on('exit', resolve);
+        child.kill(signal);
+    });
 }
 
 export const file = (name) => join(folder, name);
+
+/** A recording of one message of the object stream, as XML. */
+export function writeMessage(name, xml) {
+    const bytes = Buffer.from(`<?xml version="1.0"?><plist version="1.0">${xml}</plist>`);
+    const head = Buffer.alloc(24 + 16);
+    head.writeUInt32LE(0xa1b2c3d4, 0);
+    head.writeUInt16LE(2, 4);
+    head.writeUInt16LE(4, 6);
+    head.writeUInt32LE(65535, 16);
+    head.writeUInt32LE(147, 20);
+    head.writeUInt32LE(1700000000, 24);
+    head.writeUInt32LE(bytes.length, 32);
+    head.writeUInt32LE(bytes.length, 36);
+    writeFileSync(file(name), Buffer.concat([head, bytes]));
+    return file(name);
+}
 
 /** A report with this name, made of recordings and options. */
 export function report(name, ...words) {

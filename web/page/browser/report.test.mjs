@@ -1,7 +1,7 @@
 import assert from 'node:assert/strict';
 import { statSync, writeFileSync } from 'node:fs';
 import { after, before, test } from 'node:test';
-import { assertClean, file, launch, leavesOf, open, pallax, randomNumbers, report, seriousFindings, shownState } from './page.mjs';
+import { assertClean, file, launch, leavesOf, open, pallax, randomNumbers, report, seriousFindings, shownState, writeMessage } from './page.mjs';
 
 let browser;
 let hour;

@@ -1,36 +1,40 @@
 // The data of a live page: figures as server-sent events, everything else on demand.
+import { patched, type Patch } from './logic/patch.js';
 import { rowsOf } from './logic/rows.js';
 import type { Drawn, Figures, Seconds, Source, State } from './source.js';
 
-async function get(path: string): Promise<unknown> {
-    const response = await fetch(path);
-    if (!response.ok) throw new Error((await response.text()).trim());
-    return response.json();
-}
+const mostPoints = 50_000; // that the server gives
+const farthest = 9e9; // a time in seconds
 
 export class LiveSource implements Source {
     readonly isLive = true;
     /** Why nothing changes, in a few words; empty while all is well. */
     onWords: (text: string) => void = () => undefined;
-    private latest: Partial<Figures> = {};
+    private latest: unknown = {};
     private readonly listeners = new Set<(figures: Figures) => void>();
     private readonly first: Promise<Figures>;
+    /** Several views ask for the same at a tick. */
+    private readonly asked = new Map<string, Promise<unknown>>();
 
     constructor() {
         const events = new EventSource('/api/events');
         this.first = new Promise((resolve) => {
-            events.addEventListener('tick', (event: MessageEvent<string>) => {
-                this.latest = { ...this.latest, ...(JSON.parse(event.data) as Partial<Figures>) };
-                if ((this.latest.head?.ticks ?? 0) === 0) return; // nothing has come yet
-                const figures = this.latest as Figures;
-                resolve(figures);
-                for (const listener of this.listeners) listener(figures);
-            });
+            const take = (figures: unknown): void => {
+                this.latest = figures;
+                if (((figures as Partial<Figures>).head?.ticks ?? 0) === 0) return; // nothing has come yet
+                resolve(figures as Figures);
+                for (const listener of this.listeners) listener(figures as Figures);
+            };
+            events.addEventListener('figures', (event: MessageEvent<string>) => take(JSON.parse(event.data)));
+            events.addEventListener('patch', (event: MessageEvent<string>) =>
+                take(patched(this.latest, JSON.parse(event.data) as Patch)));
         });
         events.addEventListener('words', (event: MessageEvent<string>) => {
             this.onWords((JSON.parse(event.data) as { text: string }).text);
         });
-        events.addEventListener('error', () => this.onWords('No connection to pallax web'));
+        events.addEventListener('error', () => this.onWords(events.readyState === EventSource.CLOSED
+            ? 'The server has ended: open the link that pallax web prints when it starts again'
+            : 'No connection to pallax web'));
     }
 
     figures(): Promise<Figures> {
@@ -38,18 +42,30 @@ export class LiveSource implements Source {
     }
 
     async series(ids: readonly number[], from: Seconds, to: Seconds, points: number): Promise<Drawn> {
-        const most = Math.min(20000, Math.max(2, Math.round(points)));
-        const path = `/api/series?ids=${ids.join(',')}&from=${from}&to=${to}&points=${most}`;
-        return (await get(path)) as Drawn;
+        const [begin, end] = [Math.max(from, -farthest), Math.min(to, farthest)];
+        const most = Math.min(mostPoints, Math.max(2, Math.round(points)));
+        return (await this.get(`/api/series?ids=${ids.join(',')}&from=${begin}&to=${end}&points=${most}`)) as Drawn;
     }
 
     async stateAt(time: Seconds): Promise<State> {
-        const { display, ...state } = (await get(`/api/state?at=${time}`)) as { time: Seconds; tick: number; display: unknown };
+        const { display, ...state } = (await this.get(`/api/state?at=${time}`)) as { time: Seconds; tick: number; display: unknown };
         return { ...state, rows: rowsOf(display) };
     }
 
     onTick(listener: (figures: Figures) => void): () => void {
         this.listeners.add(listener);
         return () => this.listeners.delete(listener);
+    }
+
+    private get(path: string): Promise<unknown> {
+        const running = this.asked.get(path);
+        if (running) return running;
+        const answer = (async () => {
+            const response = await fetch(path);
+            if (!response.ok) throw new Error((await response.text()).trim());
+            return response.json() as Promise<unknown>;
+        })().finally(() => this.asked.delete(path));
+        this.asked.set(path, answer);
+        return answer;
     }
 }

@@ -12,6 +12,7 @@ import { contextsView } from './views/contexts.js';
 import { distributionView } from './views/distribution.js';
 import { eventsView } from './views/events.js';
 import { headView } from './views/head.js';
+import { LiveBar } from './views/live.js';
 import { stateView } from './views/state.js';
 import { timelineView } from './views/timeline.js';
 import { trackView } from './views/track.js';
@@ -19,21 +20,16 @@ import { verdictView } from './views/verdict.js';
 
 const has = (id: string): boolean => document.getElementById(id) !== null;
 
-/** What the server waits for stands above the page, as plain text. */
-function liveSource(): LiveSource {
-    const words = h('p', { class: 'note', role: 'status', hidden: true });
-    document.getElementById('page')!.before(words);
+function liveSource(bar: LiveBar): LiveSource {
+    document.getElementById('page')!.before(bar.element);
     const source = new LiveSource();
-    source.onWords = (text) => {
-        words.textContent = text;
-        words.hidden = text === '';
-    };
+    source.onWords = (text) => bar.say(text);
     return source;
 }
 
-async function sources(): Promise<Source[]> {
+async function sources(bar: LiveBar): Promise<Source[]> {
     const places = [0, 1].filter((place) => has(`figures-${place}`));
-    if (places.length === 0) return [liveSource()];
+    if (places.length === 0) return [liveSource(bar)];
     return Promise.all(places.map((place) => FrozenSource.read(place)));
 }
 
@@ -68,13 +64,15 @@ function chooser(models: readonly Model[], choose: (model: Model) => void): HTML
 
 async function main(): Promise<void> {
     const track = has('track') ? ((await embeddedJson('track')) as TrackPoint[]) : null;
-    const models = await Promise.all((await sources()).map(async (source) => new Model(source, await source.figures())));
+    const bar = new LiveBar();
+    const models = await Promise.all((await sources(bar)).map(async (source) => new Model(source, await source.figures())));
     const first = models[0];
     if (first === undefined) throw new Error('the page has no data');
     performance.mark('decoded');
     for (const model of models) model.source.onTick((figures) => model.update(figures));
     if (models[1] === undefined) {
         await recordingPage(first, track, []);
+        if (first.source.isLive) bar.attach(first);
     } else {
         const comparison = compareView(first, models[1]);
         const pages = new Map<Model, HTMLElement>();

@@ -2,7 +2,7 @@
 import { CellColours } from './colours.js';
 import type { Figures, Located, Seconds, Source } from './source.js';
 
-export type Part = 'data' | 'stretch' | 'window' | 'cursor' | 'look';
+export type Part = 'data' | 'stretch' | 'window' | 'cursor' | 'look' | 'hold';
 type Listener = () => void;
 
 const leastWindow = 4;
@@ -14,6 +14,9 @@ export class Model {
     to: Seconds;
     cursor: Seconds;
     colours: CellColours;
+    /** Of a live modem: a page that looks back stays as it is until it follows again. */
+    isFollowing = true;
+    private held: Figures | null = null;
     private readonly listeners: [Part, Listener][] = [];
 
     constructor(
@@ -64,8 +67,13 @@ export class Model {
     }
 
     update(figures: Figures): void {
+        if (!this.isFollowing) {
+            this.held = figures;
+            this.tell('hold');
+            return;
+        }
         const [from, to] = this.whole();
-        const [atFrom, atEnd, atCursor] = [this.from <= from, this.to >= to, this.cursor >= to];
+        const [atFrom, atEnd] = [this.from <= from, this.to >= to];
         const wasLatest = this.stretch === this.latest();
         this.figures = figures;
         if (wasLatest && this.stretch !== this.latest() && atEnd) {
@@ -80,7 +88,30 @@ export class Model {
         }
         this.tell('data');
         if (atEnd) this.tell('window');
-        if (atCursor) this.look(end);
+        this.look(end);
+    }
+
+    /** The ticks that have come since the page is held. */
+    newTicks(): number {
+        return this.held === null ? 0 : Math.max(this.held.head.ticks - this.figures.head.ticks, 0);
+    }
+
+    hold(): void {
+        this.setFollowing(false);
+    }
+
+    follow(): void {
+        this.setFollowing(true);
+        const { held } = this;
+        this.held = null;
+        if (held === null) this.look(this.whole()[1]);
+        else this.update(held);
+    }
+
+    private setFollowing(isFollowing: boolean): void {
+        if (isFollowing === this.isFollowing || !this.source.isLive) return;
+        this.isFollowing = isFollowing;
+        this.tell('hold');
     }
 
     /** Shows a part of the time. */
@@ -111,6 +142,8 @@ export class Model {
     look(time: Seconds): void {
         const [first, last] = this.whole();
         this.cursor = Math.min(Math.max(time, first), last);
+        if (this.cursor < last) this.hold();
+        else if (!this.isFollowing) this.follow();
         this.tell('cursor');
     }
 

@@ -130,3 +130,22 @@ test('of the neighbours of each system and measure six have a curve', () => {
     const all = [cell(1, 'LTE', 0), ...[2, 3, 4, 5, 6, 7, 8].map((id) => cell(id, 'LTE')), cell(9, 'GSM')];
     assert.deepEqual(chartedNeighbours(all).map((group) => group.map((each) => each.id)), [[2, 3, 4, 5, 6, 7], [9]]);
 });
+
+const { patched } = await load('patch');
+
+test('a patch makes the later value, and shares what does not change', () => {
+    const before = { head: { ticks: 1 }, events: [{ kind: 'a' }, { kind: 'b' }], states: [{ name: 'RRC', spans: [{ text: 'idle', to: 2 }] }], cells: [] };
+    const after = patched(before, { members: {
+        head: { members: { ticks: { value: 2 } } },
+        events: { items: { drop: 1, size: 1, at: {}, add: [{ kind: 'c' }] } },
+        states: { items: { drop: 0, size: 1, at: { 0: { members: { spans: { items: { drop: 0, size: 1,
+            at: { 0: { members: { to: { value: 4 } } } }, add: [{ text: 'connected', to: 6 }] } } } } }, add: [] } },
+        notes: { value: ['new'] },
+    } });
+    assert.deepEqual(after, { head: { ticks: 2 }, events: [{ kind: 'b' }, { kind: 'c' }],
+        states: [{ name: 'RRC', spans: [{ text: 'idle', to: 4 }, { text: 'connected', to: 6 }] }], cells: [], notes: ['new'] });
+    assert.equal(after.cells, before.cells);
+    assert.equal(before.head.ticks, 1);
+    assert.deepEqual(patched([1, 2, 3], { items: { drop: 0, size: 1, at: {}, add: [] } }), [1]);
+    assert.equal(patched({ a: 1 }, { value: null }), null);
+});

@@ -80,10 +80,11 @@ function optionsOf(of: ChartOf, width: number, model: Model): uPlot.Options {
 export class Charts {
     readonly element = h('div', { class: 'charts' });
     private charts: { plot: uPlot; of: ChartOf; readings: HTMLElement[] }[] = [];
+    private shown = '';
     private loading = 0;
 
     constructor(private readonly model: Model, private readonly chartsOf: () => ChartOf[]) {
-        model.on('data', () => void this.make());
+        model.on('data', () => void (JSON.stringify(this.chartsOf()) === this.shown ? this.load() : this.make()));
         model.on('window', () => void this.load());
         model.on('cursor', () => this.setCursor());
         model.on('look', () => void this.make());
@@ -95,7 +96,9 @@ export class Charts {
         for (const chart of this.charts) chart.plot.destroy();
         const width = Math.max(this.element.clientWidth, 240);
         this.element.replaceChildren();
-        this.charts = this.chartsOf().map((of) => {
+        const charts = this.chartsOf();
+        this.shown = JSON.stringify(charts);
+        this.charts = charts.map((of) => {
             const readings = of.curves.map(() => h('span', { class: 'reading' }));
             const legend = h('span', { class: 'legend' }, ...of.curves.map((curve, i) => {
                 const key = h('span', { class: 'key', 'aria-hidden': 'true' });

@@ -100,7 +100,11 @@ export function distributionView(model: Model): HTMLElement {
     fill();
     void draw();
     choice.addEventListener('change', () => void draw());
+    let ticks = model.figures.head.ticks;
     model.on('data', () => {
+        // One tick of many changes little, and costs all of them.
+        if (Math.abs(model.figures.head.ticks - ticks) < ticks / 100) return;
+        ticks = model.figures.head.ticks;
         fill();
         void draw();
     });

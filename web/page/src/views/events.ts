@@ -10,6 +10,8 @@ export function eventsView(model: Model): HTMLElement {
     const words = h('input', { type: 'search', placeholder: 'Filter', 'aria-label': 'Filter by words' });
     const count = h('output', { class: 'quiet' });
     const list = h('ol', { class: 'events' });
+    const { isLive } = model.source;
+    let drawn = model.figures.events;
     const fill = (): void => {
         const kinds = [...new Set(model.figures.events.map((event) => event.kind))].sort();
         const chosen = kind.value;
@@ -20,8 +22,10 @@ export function eventsView(model: Model): HTMLElement {
         const wanted = words.value.toLowerCase();
         const found = model.figures.events.filter((event) => (!kind.value || event.kind === kind.value) &&
             `${event.kind} ${event.words}`.toLowerCase().includes(wanted));
-        count.textContent = found.length > most ? `the first ${most} of ${counted(found.length, 'event')}` : counted(found.length, 'event');
-        list.replaceChildren(...found.slice(0, most).map((event) => h('li', {},
+        const shown = isLive ? found.slice(-most).reverse() : found.slice(0, most);
+        const place = isLive ? 'latest' : 'first';
+        count.textContent = found.length > most ? `the ${place} ${most} of ${counted(found.length, 'event')}` : counted(found.length, 'event');
+        list.replaceChildren(...shown.map((event) => h('li', {},
             button(timeText(event.time), `Look at ${timeText(event.time)}`, () => model.goTo(event.time, event.time, event.stretch)),
             h('span', { class: 'kind' }, event.kind), h('span', {}, event.words))));
     };
@@ -30,6 +34,8 @@ export function eventsView(model: Model): HTMLElement {
     kind.addEventListener('change', draw);
     words.addEventListener('input', draw);
     model.on('data', () => {
+        if (drawn === model.figures.events) return;
+        drawn = model.figures.events;
         fill();
         draw();
     });

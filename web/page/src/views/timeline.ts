@@ -49,17 +49,23 @@ function spansOfLane(model: Model, lane: Lane | undefined, from: number): LaneSp
     return model.inStretch(lane?.spans ?? []).map((span) => ({ ...span, colour: seriesColour(from + texts.indexOf(span.text)) }));
 }
 
-function lanesOf(model: Model): HTMLElement[] {
+/** The lanes of the figures; those that were there before are the same elements. */
+function lanesOf(model: Model, before: Map<string, HTMLElement>): HTMLElement[] {
     const { figures } = model;
+    const lane = (key: string, ...make: Parameters<typeof laneView>): HTMLElement => {
+        const made = before.get(key) ?? laneView(...make);
+        before.set(key, made);
+        return made;
+    };
     const systems = [...new Set(figures.cells.map((stay) => stay.system))];
-    const cells = systems.map((system) => laneView(model, systems.length > 1 ? `${system} cells` : 'Cells', () =>
+    const cells = systems.map((system) => lane(`cells ${system} ${systems.length}`, model, systems.length > 1 ? `${system} cells` : 'Cells', () =>
         model.inStretch(model.figures.cells).filter((stay) => stay.system === system).map((stay) => ({ from: stay.from, to: stay.to,
             text: stay.cell.replace(/^\S+ (?=\S+$)/, ''), colour: model.colours.of(stay.cell), isMarked: stay.pingPong }))));
-    const states = figures.states.map((lane, i) => laneView(model, lane.name,
-        () => spansOfLane(model, model.figures.states[i], 0)));
-    const contexts = figures.contexts.map((lane, i) => laneView(model, contextName(lane.name, i),
-        () => spansOfLane(model, model.figures.contexts[i], 2)));
-    return [...cells, ...states, ...contexts, laneView(model, 'Events', () => eventSpans(model.inStretch(model.figures.events)), true)];
+    const states = figures.states.map(({ name }) => lane(`state ${name}`, model, name,
+        () => spansOfLane(model, model.figures.states.find((each) => each.name === name), 0)));
+    const contexts = figures.contexts.map(({ name }, i) => lane(`context ${name}`, model, contextName(name, i),
+        () => spansOfLane(model, model.figures.contexts.find((each) => each.name === name), 2)));
+    return [...cells, ...states, ...contexts, lane('events', model, 'Events', () => eventSpans(model.inStretch(model.figures.events)), true)];
 }
 
 /** The name of a context is masked with the rest of it. */
@@ -106,7 +112,12 @@ function stretchChooser(model: Model): HTMLElement {
 /** The curves and lanes; `start` draws them once they are in the document. */
 export function timelineView(model: Model): { element: HTMLElement; start: () => Promise<void> } {
     const charts = new Charts(model, () => chartsOf(model.figures));
-    const lanes = h('div', { class: 'lanes' }, ...lanesOf(model));
+    const known = new Map<string, HTMLElement>();
+    const lanes = h('div', { class: 'lanes' }, ...lanesOf(model, known));
+    model.on('data', () => {
+        const wanted = lanesOf(model, known);
+        if (wanted.length !== lanes.childElementCount) lanes.replaceChildren(...wanted);
+    });
     const span = h('output', { class: 'quiet' });
     const showSpan = (): void => {
         span.textContent = `${clockText(model.from)} to ${clockText(model.to)} UTC`;
