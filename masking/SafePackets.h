@@ -31,6 +31,7 @@ private:
     const Resources& _resources;
     std::string _technology;
     std::map<std::string, MaskPlan, std::less<>> _plans; ///< by identifier
+    std::map<const MaskPlan*, PacketMask> _masks;
     std::vector<MaskPlan> _allPlans;                     ///< for snapshots
     Replacements _zeros;
 };
