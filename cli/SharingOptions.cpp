@@ -87,8 +87,7 @@ appears when it is complete.
 
 Exit status:
   0   success, or the reader of the output has gone
-  1   failure: cannot read a file or template, or write the page; or something
-      is missing in it, as a sentence on standard error tells
+  1   failure, or something is missing, as a sentence on standard error tells
   2   wrong usage, or a wrong condition
   70  a fatal record ends the report)";
 

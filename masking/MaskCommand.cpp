@@ -181,7 +181,7 @@ void MaskCommand::maskPacket(CapturePiece& piece, MaskReport& report) {
     const Bytes packet = piece.packet();
     ByteBuffer masked(packet.begin(), packet.end());
     if (const MaskPlan* plan = planOf(piece.linkType)) {
-        PacketMask(*plan, _replacements).mask(masked, report);
+        _masks.try_emplace(plan, *plan, _replacements).first->second.mask(masked, report);
     } else {
         ++report.packets;
         ++report.unknownPackets;

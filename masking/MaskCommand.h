@@ -58,6 +58,7 @@ private:
     Environment _environment;
     Replacements _replacements;
     std::map<std::int64_t, MaskPlan> _plans; ///< by link type
+    std::map<const MaskPlan*, PacketMask> _masks;
 };
 
 /// `pallax mask`, wired to this machine.

@@ -77,8 +77,9 @@ MaskPlan::MaskPlan(const RecordedTechnology& technology, const Resources& resour
     }
     for (const auto& [logCode, codes] : _byCode) {
         for (const CodeDescription* code : codes) {
-            if (masksIn(*code) || std::any_of(code->subpackets.begin(), code->subpackets.end(),
-                                              [this](const auto& each) { return masksIn(each); })) {
+            if (masksIn(*code) ||
+                std::any_of(code->subpackets.begin(), code->subpackets.end(),
+                            [this](const auto& each) { return this->masksIn(each); })) {
                 _masked.insert(code);
             }
         }
@@ -90,7 +91,7 @@ bool MaskPlan::masksIn(const Described& parts) const {
     return std::any_of(parts.fields.begin(), parts.fields.end(),
                        [this](const auto& each) { return of(each.row) != MaskAction::Keep; }) ||
            std::any_of(parts.lists.begin(), parts.lists.end(),
-                       [this](const auto& each) { return masksIn(each); });
+                       [this](const auto& each) { return this->masksIn(each); });
 }
 
 MaskAction MaskPlan::actionOf(const FieldInfo& field, const MaskChoice& choice) const {

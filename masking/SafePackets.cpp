@@ -16,7 +16,7 @@ ByteBuffer SafePackets::masked(Bytes packet) {
             return result;
         }
     } else if (const MaskPlan* known = plan()) {
-        PacketMask(*known, _zeros).mask(result, report);
+        _masks.try_emplace(known, *known, _zeros).first->second.mask(result, report);
         return result;
     }
     std::fill(result.begin(), result.end(), std::uint8_t{0});

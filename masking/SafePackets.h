@@ -12,8 +12,8 @@ namespace pallax {
 
 class Resources;
 
-/// The packets of a live session, masked as they arrive, before anything decodes, keeps, searches or
-/// saves them, so nothing that a viewer can do shows an identity. Until the technology is known,
+/// The packets of a live session, masked as they arrive, before anything decodes, keeps, searches
+/// or saves them, so nothing that a viewer can do shows an identity. Until the technology is known,
 /// and of an unknown one, packets are zeros.
 class SafePackets {
 public:
@@ -31,7 +31,8 @@ private:
     const Resources& _resources;
     std::string _technology;
     std::map<std::string, MaskPlan, std::less<>> _plans; ///< by identifier
-    std::vector<MaskPlan> _allPlans;                     ///< for snapshots
+    std::map<const MaskPlan*, PacketMask> _masks;
+    std::vector<MaskPlan> _allPlans; ///< for snapshots
     Replacements _zeros;
 };
 

@@ -7,7 +7,6 @@
 #include "host/Files.h"
 #include "masking/MaskPlan.h"
 #include "masking/MaskedJournal.h"
-#include "monitor/TickGrid.h"
 #include "platform/Bundle.h"
 #include "platform/Clock.h"
 #include "query/Condition.h"
@@ -47,13 +46,14 @@ const char* refusalOf(std::size_t recordings, const ReportOptions& options) {
     return nullptr;
 }
 
-/// Whether the track has a point between the earliest and the latest tick.
+/// Whether the track has a point between the earliest and the latest tick, or little before.
 bool hasPointWithin(const Track& track, const std::vector<Time>& ticks) {
     const auto [earliest, latest] = std::minmax_element(ticks.begin(), ticks.end());
-    return std::any_of(track.begin(), track.end(),
-                       [first = *earliest, last = *latest](const TrackPoint& point) {
-                           return point.time >= first - TickGrid::kInterval && point.time <= last;
-                       });
+    const Time first = *earliest - ReportBuilder::kKnownFor;
+    const Time last = *latest;
+    return std::any_of(track.begin(), track.end(), [first, last](const TrackPoint& point) {
+        return point.time >= first && point.time <= last;
+    });
 }
 
 /// What the masked packets of a technology do not show.

@@ -2,6 +2,8 @@
 
 #include "tests/masking/MaskFixture.h"
 
+#include <gtest/gtest.h>
+
 namespace pallax {
 namespace {
 

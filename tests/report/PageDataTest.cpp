@@ -48,7 +48,7 @@ TEST(PageData, HoldsTicksSeriesAndDisplay) {
     EXPECT_EQ(std::bit_cast<float>(words.next()), -91.5F);
     EXPECT_TRUE(std::isnan(std::bit_cast<float>(words.next())));
     EXPECT_EQ(words.next(), 3U) << "changes of the display";
-    for (const std::uint32_t expected : {0, 2, 1, 1, 2, 0}) {
+    for (const std::uint32_t expected : {0U, 2U, 1U, 1U, 2U, 0U}) {
         EXPECT_EQ(words.next(), expected);
     }
     EXPECT_TRUE(words.isAtEnd());
