@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <chrono>
+#include <tuple>
 #include <utility>
 
 namespace pallax {
@@ -29,6 +30,7 @@ void LiveData::begin(Timeline* timeline) {
     _timeline = timeline;
     _report = std::make_unique<ReportBuilder>(_setup.names, _setup.profile);
     _ticks.clear();
+    _stretches.clear();
     _stateTick = 0;
     _isUpToDate = false;
     if (timeline != nullptr) {
@@ -55,6 +57,9 @@ void LiveData::take(const ShownTick& tick, const CurrentValues& values) {
     const Time time = tick.tick.time;
     const bool isAfterStep = !_ticks.empty() && (time < _ticks.back().tick.time ||
                                                  time - _ticks.back().tick.time > kGap);
+    if (_ticks.empty() || time < _ticks.back().tick.time) {
+        _stretches.push_back(_ticks.size());
+    }
     _report->take({time, values, PropertyList(), isAfterStep});
     _ticks.push_back(tick);
     _isUpToDate = false;
@@ -77,8 +82,17 @@ Dictionary LiveData::gatherFigures() const {
     return figuresOf(head, *_report, _timeline->events(), _timeline->fields());
 }
 
-std::string LiveData::series(const std::vector<std::uint32_t>& ids,
-                             const SeriesRange& range) const {
+/// The places of a stretch's first tick, and of that after its last one.
+std::pair<std::size_t, std::size_t> LiveData::ticksOf(std::size_t stretch) const {
+    const auto begin = [this](std::size_t place) {
+        return place < _stretches.size() ? _stretches[place] : _ticks.size();
+    };
+    return {begin(stretch), begin(stretch + 1)};
+}
+
+std::string LiveData::series(const std::vector<std::uint32_t>& ids, SeriesRange range,
+                             std::size_t stretch) const {
+    std::tie(range.first, range.end) = ticksOf(stretch);
     static const HeldSeries kNone;
     std::vector<const HeldSeries*> series;
     for (const std::uint32_t id : ids) {
@@ -94,13 +108,16 @@ std::string LiveData::series(const std::vector<std::uint32_t>& ids,
     return seriesJson(_report->ticks(), series, range);
 }
 
-/// The times of ticks can step back.
-const ShownTick* LiveData::tickAt(Time at) const {
+const ShownTick* LiveData::tickAt(Time at, std::size_t stretch) const {
     const ShownTick* found = nullptr;
+    const auto [first, end] = ticksOf(stretch);
+    const std::size_t skipped = _ticks.size() - end;
     const auto isKept = [this](const ShownTick& tick) {
         return _timeline->keyFrames().atOrBefore(tick.packet) != nullptr;
     };
-    for (auto tick = _ticks.rbegin(); tick != _ticks.rend() && isKept(*tick); ++tick) {
+    const auto last = _ticks.rend() - static_cast<std::ptrdiff_t>(first);
+    for (auto tick = _ticks.rbegin() + static_cast<std::ptrdiff_t>(skipped);
+         tick != last && isKept(*tick); ++tick) {
         found = &*tick;
         if (tick->tick.time <= at) {
             break;
@@ -109,8 +126,8 @@ const ShownTick* LiveData::tickAt(Time at) const {
     return found;
 }
 
-std::optional<std::string> LiveData::state(Time at) {
-    const ShownTick* tick = tickAt(at);
+std::optional<std::string> LiveData::state(Time at, std::size_t stretch) {
+    const ShownTick* tick = tickAt(at, stretch);
     if (tick == nullptr) {
         return std::nullopt;
     }

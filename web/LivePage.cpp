@@ -136,6 +136,12 @@ WebResponse LivePage::stream() {
             .isStream = true};
 }
 
+/// The latest one if the request names none.
+std::optional<std::size_t> LivePage::stretchOf(const WebRequest& request) const {
+    return request.argument("stretch") != nullptr ? numberOf<std::size_t>(request, "stretch")
+                                                  : _setup.data.latestStretch();
+}
+
 WebResponse LivePage::series(const WebRequest& request) const {
     const auto ids = idsOf(request);
     const auto from = timeOf(request, "from");
@@ -150,7 +156,11 @@ WebResponse LivePage::series(const WebRequest& request) const {
     if (!points || *points > kMostPoints) {
         return badArgument("points");
     }
-    return json(_setup.data.series(*ids, {*from, *to + kWithin, *points}));
+    const auto stretch = stretchOf(request);
+    if (!stretch) {
+        return badArgument("stretch");
+    }
+    return json(_setup.data.series(*ids, {*from, *to + kWithin, *points}, *stretch));
 }
 
 WebResponse LivePage::state(const WebRequest& request) const {
@@ -158,7 +168,11 @@ WebResponse LivePage::state(const WebRequest& request) const {
     if (!at) {
         return badArgument("at");
     }
-    auto state = _setup.data.state(*at + kWithin);
+    const auto stretch = stretchOf(request);
+    if (!stretch) {
+        return badArgument("stretch");
+    }
+    auto state = _setup.data.state(*at + kWithin, *stretch);
     return state ? json(std::move(*state)) : textResponse(404, "Nothing has come yet.");
 }
 

@@ -6,6 +6,7 @@
 
 #include <functional>
 #include <memory>
+#include <optional>
 #include <string>
 
 namespace pallax {
@@ -30,6 +31,7 @@ public:
 private:
     WebResponse page() const;
     WebResponse stream();
+    std::optional<std::size_t> stretchOf(const WebRequest& request) const;
     WebResponse series(const WebRequest& request) const;
     WebResponse state(const WebRequest& request) const;
     WebResponse metrics(const WebRequest& request) const;

@@ -27,7 +27,7 @@ protected:
         appendJson(text, value);
         return json::parse(text);
     }
-    json state(Time at) { return json::parse(*data.state(at)); }
+    json state(Time at) { return json::parse(*data.state(at, 0)); }
 
     TimelineFixture recorded{"lte"};
     NetworkNames names;
@@ -40,8 +40,8 @@ protected:
 
 TEST_F(LiveDataTest, BeforeAnyPacketThereIsNothing) {
     EXPECT_EQ(jsonOf(data.figures()), json::object());
-    EXPECT_EQ(data.state(Time(0s)), std::nullopt);
-    EXPECT_EQ(data.series({1}, {Time(0s), Time(9000s), 10}), R"({"times":[],"values":[[]]})");
+    EXPECT_EQ(data.state(Time(0s), 0), std::nullopt);
+    EXPECT_EQ(data.series({1}, {Time(0s), Time(9000s), 10}, 0), R"({"times":[],"values":[[]]})");
     EXPECT_FALSE(data.status());
     data.settle();
 }
@@ -101,8 +101,8 @@ TEST_F(LiveDataTest, WhereNoPacketIsKeptThereIsNoState) {
     show(timeline);
     recorded.journal.dropBefore(half);
     (void)timeline.index([] { return true; });
-    EXPECT_EQ(data.state(Simulation::kStart), std::nullopt);
-    EXPECT_EQ(data.state(Simulation::kStart + 1h), std::nullopt);
+    EXPECT_EQ(data.state(Simulation::kStart, 0), std::nullopt);
+    EXPECT_EQ(data.state(Simulation::kStart + 1h, 0), std::nullopt);
 }
 
 TEST_F(LiveDataTest, SeriesAreNamedByTheFigures) {
@@ -110,11 +110,34 @@ TEST_F(LiveDataTest, SeriesAreNamedByTheFigures) {
     show(*timeline);
     const json figures = jsonOf(data.figures());
     const auto id = figures["measures"][0]["id"].get<std::uint32_t>();
-    const json series = json::parse(data.series({id, 9999}, {Time(0s), Time(2000000000s), 1000}));
+    const json series =
+        json::parse(data.series({id, 9999}, {Time(0s), Time(2000000000s), 1000}, 0));
     EXPECT_EQ(series["times"].size(), 30U);
     EXPECT_EQ(series["values"].size(), 2U);
     EXPECT_FALSE(series["values"][0].back().is_null());
     EXPECT_TRUE(series["values"][1].back().is_null());
+}
+
+TEST_F(LiveDataTest, WhereTheClockWasSetBackEachStretchHasItsOwn) {
+    recorded.drive(9, 20s); // begins at the same time again
+    const auto timeline = recorded.indexed();
+    show(*timeline);
+    const json figures = jsonOf(data.figures());
+    ASSERT_EQ(figures["head"]["stretches"].size(), 2U);
+    EXPECT_EQ(data.latestStretch(), 1U);
+    const auto tickAt = [this](Time at, std::size_t stretch) {
+        return json::parse(*data.state(at, stretch))["tick"].get<int>();
+    };
+    EXPECT_EQ(tickAt(Simulation::kStart + 9s, 0), 4);
+    EXPECT_GT(tickAt(Simulation::kStart + 9s, 1), 30);
+    EXPECT_EQ(tickAt(Simulation::kStart - 1h, 1), tickAt(Simulation::kStart + 2500ms, 1));
+    EXPECT_EQ(data.state(Simulation::kStart, 2), std::nullopt);
+    const auto timesOf = [this](std::size_t stretch) {
+        return json::parse(data.series({1}, {Time(0s), Time(2000000000s), 1000}, stretch))["times"];
+    };
+    EXPECT_EQ(timesOf(0).size(), figures["head"]["stretches"][0]["ticks"]);
+    EXPECT_EQ(timesOf(1).size(), figures["head"]["stretches"][1]["ticks"]);
+    EXPECT_EQ(timesOf(2).size(), 0U);
 }
 
 TEST_F(LiveDataTest, AnotherTimelineBeginsAnew) {

@@ -110,6 +110,8 @@ TEST_F(LivePageTest, AWrongArgumentIsNamed) {
                   "The argument \"points\" is missing or wrong.\n")
             << points;
     }
+    EXPECT_EQ(*get("/api/state", {{"at", "1"}, {"stretch", "x"}}).content,
+              "The argument \"stretch\" is missing or wrong.\n");
     std::string many = "1";
     for (int count = 0; count < 2000; ++count) {
         many += ",1";

@@ -58,6 +58,36 @@ TEST(SeriesJson, TimesAscendWhereTheClockWasSetBack) {
               "{\"times\":[1700000001,1700000011,1700000013],\"values\":[[-1,-1,-3]]}");
 }
 
+TEST(SeriesJson, OfAStretchHasItsTicksAlone) {
+    HeldSeries rsrp;
+    rsrp.add(0, -1);
+    rsrp.add(2, -2);
+    rsrp.add(3, -3);
+    const std::vector<Time> ticks{kStart, kStart + 2s, kStart, kStart + 2s};
+    const std::vector<const HeldSeries*> series{&rsrp};
+    SeriesRange range = kAll;
+    range.end = 2;
+    EXPECT_EQ(seriesJson(ticks, series, range),
+              "{\"times\":[1700000001,1700000003],\"values\":[[-1,-1]]}");
+    range.first = 2;
+    range.end = 4;
+    EXPECT_EQ(seriesJson(ticks, series, range),
+              "{\"times\":[1700000001,1700000003],\"values\":[[-2,-3]]}");
+}
+
+TEST(SeriesJson, HasAHoleWhereTimeIsMissing) {
+    HeldSeries rsrp;
+    rsrp.add(0, -1);
+    rsrp.add(2, -2);
+    const std::vector<const HeldSeries*> series{&rsrp};
+    const std::vector<Time> ticks{kStart, kStart + 2s, kStart + 13s, kStart + 15s};
+    const char* drawn = "{\"times\":[1700000001,1700000003,1700000003.001,1700000014,1700000016],"
+                        "\"values\":[[-1,-1,null,-2,-2]]}";
+    EXPECT_EQ(seriesJson(ticks, series, kAll), drawn);
+    EXPECT_EQ(seriesJson(ticks, series, {Time(0s), Time(2000000000s), 2}), drawn)
+        << "also between runs of ticks";
+}
+
 TEST(SeriesJson, OfManyTicksNoPeakIsLost) {
     EXPECT_TRUE(doubles::holds([] {
         namespace any = doubles::any;

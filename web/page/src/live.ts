@@ -6,6 +6,11 @@ import type { Drawn, Figures, Seconds, Source, State } from './source.js';
 const mostPoints = 50_000; // that the server gives
 const farthest = 9e9; // a time in seconds
 
+/** Without one, the server takes the latest stretch of time. */
+function inStretch(stretch: number | undefined): string {
+    return stretch === undefined ? '' : `&stretch=${stretch}`;
+}
+
 export class LiveSource implements Source {
     readonly isLive = true;
     /** Why nothing changes, in a few words; empty while all is well. */
@@ -41,14 +46,14 @@ export class LiveSource implements Source {
         return this.first;
     }
 
-    async series(ids: readonly number[], from: Seconds, to: Seconds, points: number): Promise<Drawn> {
+    async series(ids: readonly number[], from: Seconds, to: Seconds, points: number, stretch?: number): Promise<Drawn> {
         const [begin, end] = [Math.max(from, -farthest), Math.min(to, farthest)];
         const most = Math.min(mostPoints, Math.max(2, Math.round(points)));
-        return (await this.get(`/api/series?ids=${ids.join(',')}&from=${begin}&to=${end}&points=${most}`)) as Drawn;
+        return (await this.get(`/api/series?ids=${ids.join(',')}&from=${begin}&to=${end}&points=${most}${inStretch(stretch)}`)) as Drawn;
     }
 
-    async stateAt(time: Seconds): Promise<State> {
-        const { display, ...state } = (await this.get(`/api/state?at=${time}`)) as { time: Seconds; tick: number; display: unknown };
+    async stateAt(time: Seconds, stretch?: number): Promise<State> {
+        const { display, ...state } = (await this.get(`/api/state?at=${time}${inStretch(stretch)}`)) as { time: Seconds; tick: number; display: unknown };
         return { ...state, rows: rowsOf(display) };
     }
 
