@@ -26,7 +26,8 @@ constexpr const char* kLink = "11111111111111111111111111111111";
 constexpr const char* kSession = "22222222222222222222222222222222";
 
 [[noreturn]] void fail(const std::string& sentence) {
-    (void)std::fprintf(stderr, "%s\n", sentence.c_str());
+    constexpr std::size_t kMost = 300; // of a page
+    (void)std::fprintf(stderr, "%s\n", sentence.substr(0, kMost).c_str());
     std::abort();
 }
 

@@ -129,6 +129,11 @@ TEST_F(EndToEndClosedPipe, EndsBrowsingInPrint) {
     EXPECT_EQ(world.sockets(), std::vector<std::string>());
 }
 
+TEST_F(EndToEndClosedPipe, EndsTheLivePage) {
+    endsQuietly({"web", "demo", "gsm"});
+    EXPECT_TRUE(doubles::noChildLeft());
+}
+
 TEST_F(EndToEndClosedPipe, EndsSimulate) {
     const std::vector<std::string> arguments{"simulate", "lte", "--seconds", "36000", "-o", "-"};
     endsQuietly(arguments);
