@@ -28,7 +28,9 @@ LiveData::~LiveData() = default;
 void LiveData::begin(Timeline* timeline) {
     _follower.reset();
     _timeline = timeline;
-    _report = std::make_unique<ReportBuilder>(_setup.names, _setup.profile);
+    const IsLeftOut isLeftOut = [](const auto& /*path*/) { return false; }; // it gets no display
+    _report = std::make_unique<ReportBuilder>(_setup.names, _setup.profile,
+                                              _setup.head.hasIdentities ? IsLeftOut() : isLeftOut);
     _ticks.clear();
     _stretches.clear();
     _stateTick = 0;
@@ -60,7 +62,9 @@ void LiveData::take(const ShownTick& tick, const CurrentValues& values) {
     if (_ticks.empty() || time < _ticks.back().tick.time) {
         _stretches.push_back(_ticks.size());
     }
-    _report->take({time, values, PropertyList(), isAfterStep});
+    const Stretch* stretch = _timeline->stretchOfInstant(tick.packet);
+    _report->take({time, values, PropertyList(), isAfterStep,
+                   stretch != nullptr ? stretch->firstPacket : 0});
     _ticks.push_back(tick);
     _isUpToDate = false;
 }

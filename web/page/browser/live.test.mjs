@@ -74,7 +74,15 @@ test('survives the death of the service, and its return', async () => {
     const again = await serveService('van', '--simulate', 'lte', '--seed', '9', '--speed', '20');
     await page.waitForFunction(() => document.querySelector('.live [role=status]').textContent === '');
     await page.waitForFunction((time) => globalThis.pallaxModels[0].figures.head.to !== time, to);
-    await waitForTicks(page, 5);
+    // The simulation begins at the same time again: another stretch of time, which is shown at once.
+    assert.deepEqual(await page.evaluate(() => {
+        const model = globalThis.pallaxModels[0];
+        return [model.stretch, model.figures.head.stretches.length, [0, 1].every((each) => model.figures.cells.some((stay) => stay.stretch === each))];
+    }), [1, 2, true]);
+    await page.getByLabel('Stretch of time').selectOption('0');
+    assert.equal((await modelOf(page)).isFollowing, false, 'an earlier stretch is held');
+    await page.getByRole('button', { name: 'Follow' }).click();
+    assert.equal(await page.getByLabel('Stretch of time').inputValue(), '1');
     await page.waitForFunction(() => Number(document.querySelector('#state-table').dataset.time) === globalThis.pallaxModels[0].cursor);
     assertClean(problems);
     await page.context().close();

@@ -74,21 +74,23 @@ export class Model {
         }
         const [from, to] = this.whole();
         const [atFrom, atEnd] = [this.from <= from, this.to >= to];
-        const wasLatest = this.stretch === this.latest();
         this.figures = figures;
-        if (wasLatest && this.stretch !== this.latest() && atEnd) {
-            this.stretch = this.latest();
-            [this.from, this.to] = this.whole();
-        }
         this.colours = new CellColours(figures.cells.map((stay) => stay.cell));
+        const isNew = this.stretch !== this.latest();
+        if (isNew) this.showLatest();
         const [newFrom, end] = this.whole();
-        if (atEnd) {
+        if (atEnd && !isNew) {
             this.from = atFrom ? newFrom : this.from + (end - to);
             this.to = end;
         }
         this.tell('data');
-        if (atEnd) this.tell('window');
+        if (atEnd || isNew) this.tell('window');
         this.look(end);
+    }
+
+    private showLatest(): void {
+        this.stretch = this.latest();
+        [this.from, this.to] = this.whole();
     }
 
     /** The ticks that have come since the page is held. */
@@ -104,8 +106,11 @@ export class Model {
         this.setFollowing(true);
         const { held } = this;
         this.held = null;
+        if (this.stretch !== this.latest()) this.showLatest();
         if (held === null) this.look(this.whole()[1]);
         else this.update(held);
+        this.tell('stretch');
+        this.tell('window');
     }
 
     private setFollowing(isFollowing: boolean): void {
@@ -142,7 +147,7 @@ export class Model {
     look(time: Seconds): void {
         const [first, last] = this.whole();
         this.cursor = Math.min(Math.max(time, first), last);
-        if (this.cursor < last) this.hold();
+        if (this.cursor < last || this.stretch !== this.latest()) this.hold();
         else if (!this.isFollowing) this.follow();
         this.tell('cursor');
     }
