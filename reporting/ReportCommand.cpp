@@ -35,6 +35,18 @@ std::string shownName(const PartPaths& paths) {
     return std::filesystem::path(isSeveral ? part->whole : paths.front()).filename().string();
 }
 
+/// A sentence about a file, for readers who do not know its folder.
+std::string withoutFolders(std::string sentence, const PartPaths& paths) {
+    for (const std::string& path : paths) {
+        const std::string name = std::filesystem::path(path).filename().string();
+        const std::size_t place = sentence.find(path);
+        if (place != std::string::npos) {
+            sentence.replace(place, path.size(), name);
+        }
+    }
+    return sentence;
+}
+
 /// Null if there is nothing wrong with the number of recordings.
 const char* refusalOf(std::size_t recordings, const ReportOptions& options) {
     if (recordings > ReportCommand::kMostRecordings) {
@@ -167,7 +179,9 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
         return std::nullopt;
     }
     ReportHead head = headOf(paths, place, timeline);
-    head.notes = notes;
+    for (const std::string& note : notes) {
+        head.notes.push_back(withoutFolders(note, paths));
+    }
     status = timeline.hasEnded() ? kExitFatalRecord : status;
     const Dictionary figures = figuresOf(head, report, events, timeline.fields());
     Part part{.ticks = report.ticks()};

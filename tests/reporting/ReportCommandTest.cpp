@@ -192,6 +192,33 @@ TEST_F(ReportCommandTest, RefusesATrackOfAnotherTime) {
     }
 }
 
+TEST_F(ReportCommandTest, OfADamagedRecordingSaysWhereAndNamesNoFolder) {
+    std::string drive = doubles::contentOf(sample("lte-drive.pcap"));
+    const std::string cut = file("cut.pcap", drive.substr(0, drive.size() / 2));
+    options.json = true;
+    const auto report = make({cut});
+    ASSERT_TRUE(report);
+    EXPECT_EQ(status, kExitFailure);
+    EXPECT_EQ(reports, std::vector<std::string>{cut + " ends in the middle of a packet."});
+    EXPECT_EQ(json::parse(*report)["head"]["notes"],
+              json::array({"cut.pcap ends in the middle of a packet."}));
+    constexpr std::size_t kLengthOfFirst = 24 + 8;
+    drive.replace(kLengthOfFirst, 4, "\xFF\xFF\xFF\x7F");
+    const std::string damaged = file("damaged.pcap", drive);
+    EXPECT_FALSE(make({damaged}));
+    EXPECT_EQ(status, kExitFailure);
+    ASSERT_EQ(reports.size(), 1U) << "not that there are no packets, too";
+    EXPECT_TRUE(reports[0].starts_with(damaged + " cannot be read further: ")) << reports[0];
+}
+
+TEST_F(ReportCommandTest, OfASnapshotIsNone) {
+    const std::string saved = snapshot({{"2023-11-14 22:13:20", Dictionary{{"A", "1"}}}});
+    EXPECT_FALSE(make({saved}));
+    EXPECT_EQ(status, kExitFailure);
+    EXPECT_EQ(reports, std::vector<std::string>{
+                           saved + " is a snapshot, which holds a few displays and no packets."});
+}
+
 TEST_F(ReportCommandTest, WhatCannotBeReadIsOneSentence) {
     EXPECT_FALSE(make({folder.file("none.pcap")}));
     EXPECT_EQ(status, kExitFailure);
