@@ -35,6 +35,14 @@ std::string shownName(const PartPaths& paths) {
     return std::filesystem::path(isSeveral ? part->whole : paths.front()).filename().string();
 }
 
+/// Masks packets before anything else sees them.
+auto maskWith(const Resources& resources) {
+    return
+        [&resources](std::unique_ptr<PacketJournal> packets, const RecordedTechnology& technology) {
+            return std::make_unique<MaskedJournal>(std::move(packets), technology, resources);
+        };
+}
+
 /// A sentence about a file, for readers who do not know its folder.
 std::string withoutFolders(std::string sentence, const PartPaths& paths) {
     for (const std::string& path : paths) {
@@ -144,14 +152,11 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
     if (const auto missing = missingParts(paths)) {
         _environment.report(*missing);
     }
-    RecordedTimeline::Request request{paths, _options.technology, _environment.journal,
-                                      _environment.progress};
+    RecordedTimeline::Request request{
+        paths, _options.technology, _environment.journal,
+        [this](std::uint64_t packets) { showProgress("reading", packets); }};
     if (!_options.withIdentities) {
-        request.through = [this](std::unique_ptr<PacketJournal> packets,
-                                 const RecordedTechnology& technology) {
-            return std::make_unique<MaskedJournal>(std::move(packets), technology,
-                                                   _environment.decoder.resources);
-        };
+        request.through = maskWith(_environment.decoder.resources);
     }
     const auto recorded = RecordedTimeline::open(request, _environment.decoder);
     if (!recorded) {
@@ -223,6 +228,7 @@ bool ReportCommand::gather(Timeline& timeline, const std::string& name, ReportBu
         condition = std::move(compiled).value();
     }
     gatherTicks(timeline, report, [&](const TickWalk::State& state) {
+        showProgress("gathering", state.packet);
         if (!window.contains(state.tick.time) || condition == nullptr) {
             return window.contains(state.tick.time);
         }
@@ -242,6 +248,12 @@ bool ReportCommand::gather(Timeline& timeline, const std::string& name, ReportBu
         return false;
     }
     return true;
+}
+
+void ReportCommand::showProgress(std::string_view doing, std::uint64_t packets) const {
+    if (_environment.progress) {
+        _environment.progress(doing, packets);
+    }
 }
 
 ReportHead ReportCommand::headOf(const PartPaths& paths, std::size_t place,

@@ -6,6 +6,7 @@
 #include <nlohmann/json.hpp>
 
 #include <fstream>
+#include <map>
 
 namespace pallax {
 namespace {
@@ -19,8 +20,14 @@ protected:
         options.recordings = recordings;
         reports.clear();
         const ReportCommand::Environment environment{
-            decoder, names, profile, zone,
-            [this](const std::string& sentence) { reports.push_back(sentence); }};
+            decoder,
+            names,
+            profile,
+            zone,
+            [this](const std::string& sentence) { reports.push_back(sentence); },
+            [this](std::string_view doing, std::uint64_t packets) {
+                progress[std::string(doing)] = packets;
+            }};
         return ReportCommand(options, environment).make(status);
     }
     json figures(const std::string& recording) {
@@ -36,6 +43,7 @@ protected:
         return path;
     }
 
+    std::map<std::string, std::uint64_t> progress; ///< the latest
     ReportOptions options;
     ExitStatus status = kExitSuccess;
     NetworkNames names;
@@ -62,6 +70,12 @@ TEST_F(ReportCommandTest, OfASampleHasItsFigures) {
     }
     EXPECT_EQ(cells, (std::vector<std::string>{"PCI 182", "PCI 183", "PCI 285", "PCI 82", "PCI 286",
                                                "PCI 184"}));
+}
+
+TEST_F(ReportCommandTest, TellsHowFarItIs) {
+    ASSERT_TRUE(make({sample("lte-drive.pcap")}));
+    EXPECT_EQ(progress,
+              (std::map<std::string, std::uint64_t>{{"gathering", 1200}, {"reading", 1199}}));
 }
 
 TEST_F(ReportCommandTest, LeavesOutWhatIdentifiesAPerson) {
