@@ -5,8 +5,8 @@
 #include "decoding/StateCondition.h"
 #include "fields/Reference.h"
 #include "host/Files.h"
-#include "masking/MaskPlan.h"
 #include "masking/MaskedJournal.h"
+#include "masking/MaskedPlaces.h"
 #include "platform/Bundle.h"
 #include "platform/Clock.h"
 #include "query/Condition.h"
@@ -74,15 +74,6 @@ bool hasPointWithin(const Track& track, const std::vector<Time>& ticks) {
     return std::any_of(track.begin(), track.end(), [first, last](const TrackPoint& point) {
         return point.time >= first && point.time <= last;
     });
-}
-
-/// What the masked packets of a technology do not show.
-IsLeftOut leftOutOf(const RecordedTechnology& technology, const Resources& resources) {
-    const auto plan = std::make_shared<MaskPlan>(technology, resources, MaskChoice());
-    return [plan](const ScalarPath& path) {
-        return plan->ofDisplay(path) == MaskAction::Mask ||
-               (plan->areObjects() && std::any_of(path.begin(), path.end(), isPersonalKey));
-    };
 }
 
 TimeSpan spanOf(const Timeline& timeline) {
@@ -177,7 +168,7 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
     const RecordedTechnology& technology = *technologyOfCommandName(timeline.fields().technology());
     const IsLeftOut isLeftOut = _options.withIdentities
                                     ? IsLeftOut()
-                                    : leftOutOf(technology, _environment.decoder.resources);
+                                    : maskedPlaces(technology, _environment.decoder.resources);
     ReportBuilder report(_environment.names, _environment.profile, isLeftOut);
     std::vector<Event> events;
     if (!gather(timeline, name, report, events, status)) {
