@@ -7,9 +7,6 @@
 
 namespace pallax {
 
-namespace {
-
-/// The first packet of the stretch of time that a packet is in.
 std::uint64_t firstPacketAround(const Timeline& timeline, std::uint64_t packet) {
     std::uint64_t first = 0;
     for (const Stretch& stretch : timeline.stretches()) {
@@ -17,8 +14,6 @@ std::uint64_t firstPacketAround(const Timeline& timeline, std::uint64_t packet) 
     }
     return first;
 }
-
-} // namespace
 
 void gatherTicks(Timeline& timeline, ReportBuilder& report,
                  const std::function<bool(const TickWalk::State& state)>& isWanted) {

@@ -5,8 +5,8 @@
 #include "decoding/StateCondition.h"
 #include "fields/Reference.h"
 #include "host/Files.h"
-#include "masking/MaskPlan.h"
 #include "masking/MaskedJournal.h"
+#include "masking/MaskedPlaces.h"
 #include "platform/Bundle.h"
 #include "platform/Clock.h"
 #include "query/Condition.h"
@@ -35,6 +35,26 @@ std::string shownName(const PartPaths& paths) {
     return std::filesystem::path(isSeveral ? part->whole : paths.front()).filename().string();
 }
 
+/// Masks packets before anything else sees them.
+auto maskWith(const Resources& resources) {
+    return
+        [&resources](std::unique_ptr<PacketJournal> packets, const RecordedTechnology& technology) {
+            return std::make_unique<MaskedJournal>(std::move(packets), technology, resources);
+        };
+}
+
+/// A sentence about a file, for readers who do not know its folder.
+std::string withoutFolders(std::string sentence, const PartPaths& paths) {
+    for (const std::string& path : paths) {
+        const std::string name = std::filesystem::path(path).filename().string();
+        const std::size_t place = sentence.find(path);
+        if (place != std::string::npos) {
+            sentence.replace(place, path.size(), name);
+        }
+    }
+    return sentence;
+}
+
 /// Null if there is nothing wrong with the number of recordings.
 const char* refusalOf(std::size_t recordings, const ReportOptions& options) {
     if (recordings > ReportCommand::kMostRecordings) {
@@ -54,15 +74,6 @@ bool hasPointWithin(const Track& track, const std::vector<Time>& ticks) {
     return std::any_of(track.begin(), track.end(), [first, last](const TrackPoint& point) {
         return point.time >= first && point.time <= last;
     });
-}
-
-/// What the masked packets of a technology do not show.
-IsLeftOut leftOutOf(const RecordedTechnology& technology, const Resources& resources) {
-    const auto plan = std::make_shared<MaskPlan>(technology, resources, MaskChoice());
-    return [plan](const ScalarPath& path) {
-        return plan->ofDisplay(path) == MaskAction::Mask ||
-               (plan->areObjects() && std::any_of(path.begin(), path.end(), isPersonalKey));
-    };
 }
 
 TimeSpan spanOf(const Timeline& timeline) {
@@ -132,14 +143,11 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
     if (const auto missing = missingParts(paths)) {
         _environment.report(*missing);
     }
-    RecordedTimeline::Request request{paths, _options.technology, _environment.journal,
-                                      _environment.progress};
+    RecordedTimeline::Request request{
+        paths, _options.technology, _environment.journal,
+        [this](std::uint64_t packets) { showProgress("reading", packets); }};
     if (!_options.withIdentities) {
-        request.through = [this](std::unique_ptr<PacketJournal> packets,
-                                 const RecordedTechnology& technology) {
-            return std::make_unique<MaskedJournal>(std::move(packets), technology,
-                                                   _environment.decoder.resources);
-        };
+        request.through = maskWith(_environment.decoder.resources);
     }
     const auto recorded = RecordedTimeline::open(request, _environment.decoder);
     if (!recorded) {
@@ -160,14 +168,16 @@ std::optional<ReportCommand::Part> ReportCommand::makePart(const PartPaths& path
     const RecordedTechnology& technology = *technologyOfCommandName(timeline.fields().technology());
     const IsLeftOut isLeftOut = _options.withIdentities
                                     ? IsLeftOut()
-                                    : leftOutOf(technology, _environment.decoder.resources);
+                                    : maskedPlaces(technology, _environment.decoder.resources);
     ReportBuilder report(_environment.names, _environment.profile, isLeftOut);
     std::vector<Event> events;
     if (!gather(timeline, name, report, events, status)) {
         return std::nullopt;
     }
     ReportHead head = headOf(paths, place, timeline);
-    head.notes = notes;
+    for (const std::string& note : notes) {
+        head.notes.push_back(withoutFolders(note, paths));
+    }
     status = timeline.hasEnded() ? kExitFatalRecord : status;
     const Dictionary figures = figuresOf(head, report, events, timeline.fields());
     Part part{.ticks = report.ticks()};
@@ -209,6 +219,7 @@ bool ReportCommand::gather(Timeline& timeline, const std::string& name, ReportBu
         condition = std::move(compiled).value();
     }
     gatherTicks(timeline, report, [&](const TickWalk::State& state) {
+        showProgress("gathering", state.packet);
         if (!window.contains(state.tick.time) || condition == nullptr) {
             return window.contains(state.tick.time);
         }
@@ -228,6 +239,12 @@ bool ReportCommand::gather(Timeline& timeline, const std::string& name, ReportBu
         return false;
     }
     return true;
+}
+
+void ReportCommand::showProgress(std::string_view doing, std::uint64_t packets) const {
+    if (_environment.progress) {
+        _environment.progress(doing, packets);
+    }
 }
 
 ReportHead ReportCommand::headOf(const PartPaths& paths, std::size_t place,

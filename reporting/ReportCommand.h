@@ -14,6 +14,7 @@
 #include <functional>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace pallax {
@@ -52,7 +53,7 @@ public:
         const QualityProfile& profile;
         const Clock& zone; ///< for times of the command line
         std::function<void(const std::string& sentence)> report;
-        std::function<void(std::uint64_t packets)> progress = {};
+        std::function<void(std::string_view doing, std::uint64_t packets)> progress = {};
         BoundedJournal::Limits journal = {}; ///< for recordings that are kept
     };
 
@@ -71,6 +72,7 @@ private:
     };
 
     std::optional<Part> makePart(const PartPaths& paths, std::size_t place, ExitStatus& status);
+    void showProgress(std::string_view doing, std::uint64_t packets) const;
     /// False after a complaint about the options.
     bool gather(Timeline& timeline, const std::string& name, ReportBuilder& report,
                 std::vector<struct Event>& events, ExitStatus& status);

@@ -73,21 +73,21 @@ ExitStatus make(const ReportOptions& options, const Settings& settings,
     ProgressPace pace(clock);
     const DecoderEnvironment decoder{resources, bundle, notices, technologies(),
                                      installedKnowledge()};
-    const ReportCommand::Environment environment{decoder,
-                                                 installed.names,
-                                                 profile,
-                                                 clock,
-                                                 [&line](const std::string& sentence) {
-                                                     line.wipe();
-                                                     complain(sentence);
-                                                 },
-                                                 [&](std::uint64_t packets) {
-                                                     if (line.isPossible() && pace.isDue()) {
-                                                         line.show("reading: " +
-                                                                   packetCount(packets));
-                                                     }
-                                                 },
-                                                 settings.journal};
+    const ReportCommand::Environment environment{
+        decoder,
+        installed.names,
+        profile,
+        clock,
+        [&line](const std::string& sentence) {
+            line.wipe();
+            complain(sentence);
+        },
+        [&](std::string_view doing, std::uint64_t packets) {
+            if (line.isPossible() && pace.isDue()) {
+                line.show(std::string(doing) + ": " + packetCount(packets));
+            }
+        },
+        settings.journal};
     ExitStatus status = kExitSuccess;
     const auto content = ReportCommand(options, environment).make(status);
     line.wipe();

@@ -7,6 +7,7 @@
 
 #include <array>
 #include <cerrno>
+#include <csignal>
 #include <fcntl.h>
 #include <filesystem>
 #include <sys/stat.h>
@@ -64,13 +65,17 @@ TEST_F(NewFileTest, WritesToAPipeAndLeavesItAPipe) {
     EXPECT_TRUE(fs::is_fifo(path));
 }
 
-TEST_F(NewFileTest, WritesToADeviceThatIsFull) {
-    fs::create_symlink("/dev/full", path);
+TEST_F(NewFileTest, TellsThatAPipeIsClosed) {
+    ASSERT_EQ(::mkfifo(path.c_str(), S_IRUSR | S_IWUSR), 0);
+    Descriptor reader(::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));
     const auto file = NewFile::create(path);
     ASSERT_TRUE(file);
+    reader = Descriptor();
+    const auto before = std::signal(SIGPIPE, SIG_IGN);
     EXPECT_FALSE(file->write(content()));
-    EXPECT_EQ(errno, ENOSPC);
-    EXPECT_TRUE(fs::is_character_file(path));
+    EXPECT_EQ(errno, EPIPE);
+    std::signal(SIGPIPE, before);
+    EXPECT_TRUE(fs::is_fifo(path));
 }
 
 } // namespace

@@ -6,6 +6,7 @@
 #include <nlohmann/json.hpp>
 
 #include <fstream>
+#include <map>
 
 namespace pallax {
 namespace {
@@ -19,8 +20,14 @@ protected:
         options.recordings = recordings;
         reports.clear();
         const ReportCommand::Environment environment{
-            decoder, names, profile, zone,
-            [this](const std::string& sentence) { reports.push_back(sentence); }};
+            decoder,
+            names,
+            profile,
+            zone,
+            [this](const std::string& sentence) { reports.push_back(sentence); },
+            [this](std::string_view doing, std::uint64_t packets) {
+                progress[std::string(doing)] = packets;
+            }};
         return ReportCommand(options, environment).make(status);
     }
     json figures(const std::string& recording) {
@@ -36,6 +43,7 @@ protected:
         return path;
     }
 
+    std::map<std::string, std::uint64_t> progress; ///< the latest
     ReportOptions options;
     ExitStatus status = kExitSuccess;
     NetworkNames names;
@@ -62,6 +70,12 @@ TEST_F(ReportCommandTest, OfASampleHasItsFigures) {
     }
     EXPECT_EQ(cells, (std::vector<std::string>{"PCI 182", "PCI 183", "PCI 285", "PCI 82", "PCI 286",
                                                "PCI 184"}));
+}
+
+TEST_F(ReportCommandTest, TellsHowFarItIs) {
+    ASSERT_TRUE(make({sample("lte-drive.pcap")}));
+    EXPECT_EQ(progress,
+              (std::map<std::string, std::uint64_t>{{"gathering", 1200}, {"reading", 1199}}));
 }
 
 TEST_F(ReportCommandTest, LeavesOutWhatIdentifiesAPerson) {
@@ -190,6 +204,33 @@ TEST_F(ReportCommandTest, RefusesATrackOfAnotherTime) {
                                                     " cannot be used as a track: none of its "
                                                     "points is in the time of the report."});
     }
+}
+
+TEST_F(ReportCommandTest, OfADamagedRecordingSaysWhereAndNamesNoFolder) {
+    std::string drive = doubles::contentOf(sample("lte-drive.pcap"));
+    const std::string cut = file("cut.pcap", drive.substr(0, drive.size() / 2));
+    options.json = true;
+    const auto report = make({cut});
+    ASSERT_TRUE(report);
+    EXPECT_EQ(status, kExitFailure);
+    EXPECT_EQ(reports, std::vector<std::string>{cut + " ends in the middle of a packet."});
+    EXPECT_EQ(json::parse(*report)["head"]["notes"],
+              json::array({"cut.pcap ends in the middle of a packet."}));
+    constexpr std::size_t kLengthOfFirst = 24 + 8;
+    drive.replace(kLengthOfFirst, 4, "\xFF\xFF\xFF\x7F");
+    const std::string damaged = file("damaged.pcap", drive);
+    EXPECT_FALSE(make({damaged}));
+    EXPECT_EQ(status, kExitFailure);
+    ASSERT_EQ(reports.size(), 1U) << "not that there are no packets, too";
+    EXPECT_TRUE(reports[0].starts_with(damaged + " cannot be read further: ")) << reports[0];
+}
+
+TEST_F(ReportCommandTest, OfASnapshotIsNone) {
+    const std::string saved = snapshot({{"2023-11-14 22:13:20", Dictionary{{"A", "1"}}}});
+    EXPECT_FALSE(make({saved}));
+    EXPECT_EQ(status, kExitFailure);
+    EXPECT_EQ(reports, std::vector<std::string>{
+                           saved + " is a snapshot, which holds a few displays and no packets."});
 }
 
 TEST_F(ReportCommandTest, WhatCannotBeReadIsOneSentence) {

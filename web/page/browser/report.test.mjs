@@ -203,6 +203,26 @@ test('texts of a modem that look like markup are shown as texts', async () => {
     await page.context().close();
 });
 
+test('hostile names and numbers leave the page readable', async () => {
+    const huge = 'N'.repeat(2000);
+    const neighbours = Array.from({ length: 550 }, (_, i) => `<dict><key>ARFCN</key><string>${i}</string><key>Rx Level</key><string>-90 dBm</string></dict>`);
+    const message = (i, level, name) => [1700000000 + 2 * i, `<dict><key>Network</key><dict><key>Name</key><string>${name}</string>` +
+        `<key>MCC</key><string>262</string><key>MNC</key><string>42</string></dict><key>${name}</key><string>${name}</string>` +
+        `<key>Serving Cell</key><dict><key>ARFCN</key><string>62</string><key>BSIC</key><string>${name}</string><key>Rx Level</key>` +
+        `<string>${level}</string></dict><key>Neighbour Cells</key><array>${neighbours.join('')}</array></dict>`];
+    const levels = ['nan dBm', 'inf dBm', '1e308 dBm', '-1e308 dBm', '', '-70 dBm'];
+    const recording = writeMessages('hostile.pcap', levels.map((level, i) => message(i, level, [huge, 'a\u202eb\u2066'][i % 2])));
+    const url = report('hostile.html', recording);
+    for (const width of [1440, 360]) {
+        const { page, problems } = await open(browser, url, { width });
+        assert.ok(await page.evaluate(() => document.scrollingElement.scrollWidth <= innerWidth), `wider than ${width}`);
+        assert.equal((await shownState(page, 1700000012)).get('a\\u202Eb\\u2066'), 'a\\u202Eb\\u2066');
+        assert.ok(await page.getByText('Only the first 512 neighbouring cells are in the report.').isVisible());
+        assertClean(problems);
+        await page.context().close();
+    }
+});
+
 test('every technology, two recordings and a track are clean', async () => {
     const points = Array.from({ length: 60 }, (_, i) => `<trkpt lat="${50 + 0.001 * i}" lon="${7 + 0.0015 * Math.sin(i / 9)}"><time>` +
         `${new Date(1000 * (1700000000 + 2 * i)).toISOString()}</time></trkpt>`);

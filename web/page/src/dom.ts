@@ -1,14 +1,16 @@
 // Elements from data. Every text becomes a text node, so nothing from a modem is ever markup.
 
+import { printable } from './logic/text.js';
+
 type Child = Node | string | null;
 type Attributes = Record<string, string | number | boolean | null>;
 
 function fill<E extends Element>(element: E, attributes: Attributes, children: readonly Child[]): E {
     for (const [name, value] of Object.entries(attributes)) {
         if (value === null || value === false) continue;
-        element.setAttribute(name, value === true ? '' : String(value));
+        element.setAttribute(name, value === true ? '' : printable(String(value)));
     }
-    element.append(...children.filter((child) => child !== null));
+    element.append(...children.filter((child) => child !== null).map((child) => (typeof child === 'string' ? printable(child) : child)));
     return element;
 }
 

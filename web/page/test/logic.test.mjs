@@ -56,6 +56,10 @@ test('times are ISO, of 24 hours, in UTC', () => {
     assert.deepEqual([48, 200, 3900].map(text.durationText), ['48 s', '3 min 20 s', '1 h 05 min']);
 });
 
+test('what turns the direction of a text, or controls a terminal, stands as an escape', () => {
+    assert.equal(text.printable('a\u202eb\u2069\u0007\u0085\n\t\u00e9 <b>'), 'a\\u202Eb\\u2069\\x07\\u0085\n\t\u00e9 <b>');
+});
+
 test('shares do not hide what is small', () => {
     assert.deepEqual([0, 0.004, 0.31, 0.996, 1].map(text.shareText), ['0 %', '0.4 %', '31 %', '99.6 %', '100 %']);
 });

@@ -1,6 +1,14 @@
 // Times, numbers and grades as the page writes them.
 import type { Border, Head, Measure, Profile, Seconds } from '../source.js';
 
+/** Control characters and those that turn the direction of the text around them stand as escapes, as in a terminal. */
+export function printable(text: string): string {
+    return text.replace(/[\u0000-\u0008\u000b-\u001f\u007f-\u009f\u061c\u200e\u200f\u202a-\u202e\u2066-\u2069]/g, (each) => {
+        const code = each.charCodeAt(0).toString(16).toUpperCase();
+        return code.length <= 2 && each < '\u0080' ? `\\x${code.padStart(2, '0')}` : `\\u${code.padStart(4, '0')}`;
+    });
+}
+
 const pad = (value: number, digits = 2): string => String(value).padStart(digits, '0');
 
 /** "2023-11-14". */

@@ -1,5 +1,5 @@
 import { h } from '../dom.js';
-import { counted, durationText, limitsOf, timeText, titleOf } from '../logic/text.js';
+import { counted, durationText, limitsOf, printable, timeText, titleOf } from '../logic/text.js';
 import type { Model } from '../model.js';
 
 export function headView(model: Model): HTMLElement {
@@ -16,7 +16,7 @@ export function headView(model: Model): HTMLElement {
         const people = head.identities === 'included'
             ? h('strong', {}, 'This page holds what identifies a person.')
             : 'What identifies a person is left out.';
-        document.title = titleOf(head);
+        document.title = printable(titleOf(head));
         place.replaceChildren(
             h('h1', {}, titleOf(head)),
             h('p', { class: 'lead' }, [head.label, head.technology, head.operator, head.recording].filter((text) => text).join(' · ')),

@@ -1,6 +1,7 @@
 // Rows of spans over the time of the charts: cells, states, contexts, events.
 import { styleColour } from '../colours.js';
 import { h } from '../dom.js';
+import { printable } from '../logic/text.js';
 import type { Model } from '../model.js';
 import { gutter } from './charts.js';
 
@@ -53,7 +54,7 @@ function drawSpans(canvas: HTMLCanvasElement, model: Model, spans: readonly Lane
         context.rect(left, 0, right - left - 2, height);
         context.clip();
         context.fillStyle = ink;
-        context.fillText((span.isMarked ? '↺ ' : '') + span.text, left + 6, height / 2 + 1);
+        context.fillText((span.isMarked ? '↺ ' : '') + printable(span.text), left + 6, height / 2 + 1);
         context.restore();
     }
     const cursor = x(model.cursor);
@@ -82,7 +83,7 @@ export function laneView(model: Model, name: string, spansOf: () => LaneSpan[], 
         const time = timeAt(event);
         const margin = isPoint ? (6 / canvas.clientWidth) * (model.to - model.from) : 0;
         canvas.title = spans.filter((span) => span.from - margin <= time && time <= span.to + margin)
-            .map((span) => span.text).slice(0, 8).join('\n');
+            .map((span) => printable(span.text)).slice(0, 8).join('\n');
         model.look(time);
     });
     return h('div', { class: 'lane' }, label, canvas);
