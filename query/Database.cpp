@@ -192,7 +192,9 @@ Database::Database() : _authority(std::make_unique<Authority>()), _schemas{"main
 Database::Database(const std::string& file)
     : _authority(std::make_unique<Authority>()), _schemas{"main"} {
     // SQLite takes no other name for a file, whatever it begins with.
-    open(file.starts_with('/') ? file : "./" + file, SQLITE_OPEN_READONLY);
+    // Only who may write a file tidies up after a writer that was killed; queries do not write.
+    open(file.starts_with('/') ? file : "./" + file, SQLITE_OPEN_READWRITE);
+    run(*_connection, "PRAGMA query_only = true");
     // Anybody may have made it.
     sqlite3_db_config(_connection.get(), SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
     sqlite3_db_config(_connection.get(), SQLITE_DBCONFIG_TRUSTED_SCHEMA, 0, nullptr);

@@ -16,8 +16,9 @@ constexpr const char* kAddField =
     "UPDATE SET path = ?2, kind = ?3, unit = ?4, least = ?5, most = ?6, in_list = ?7, "
     "identifies = ?8, personal = ?9, meaning = ?10, shown = ?11 RETURNING id";
 
-std::string bytesOf(double number) {
-    return {static_cast<const char*>(static_cast<const void*>(&number)), sizeof number};
+template <class Value>
+std::string bytesOf(const Value& value) {
+    return {static_cast<const char*>(static_cast<const void*>(&value)), sizeof value};
 }
 
 } // namespace
@@ -80,9 +81,9 @@ std::optional<std::int64_t> NamedRows::text(const FieldInfo& info, const FieldVa
                                             const std::string& format) {
     // The text and its reason follow from these.
     std::string key = info.name + '\n' + format + '\n' + std::to_string(value.raw.value_or(-1)) +
-                      (value.raw ? "r" : "");
+                      (value.raw ? "r" : "") + (value.shown.displayNumber() != nullptr ? "n" : "t");
     const DisplayNumber* shown = value.shown.displayNumber();
-    key += shown != nullptr ? bytesOf(value.number) : "t" + value.text();
+    key += shown != nullptr ? bytesOf(&shown->format()) + bytesOf(value.number) : value.text();
     const auto [place, isNew] = _texts.try_emplace(std::move(key));
     if (isNew) {
         const std::string text = value.text();
