@@ -89,15 +89,15 @@ void addLoading(CLI::App& app, StoreRequest& request) {
 
 /// "30s", "1m", "6h", "1d".
 std::chrono::nanoseconds stepOf(const std::string& text) {
-    static const std::map<char, std::chrono::seconds> units{
-        {'s', std::chrono::seconds(1)},
-        {'m', std::chrono::minutes(1)},
-        {'h', std::chrono::hours(1)},
-        {'d', std::chrono::days(1)}};
+    static const std::map<char, std::chrono::seconds> units{{'s', std::chrono::seconds(1)},
+                                                            {'m', std::chrono::minutes(1)},
+                                                            {'h', std::chrono::hours(1)},
+                                                            {'d', std::chrono::days(1)}};
     const auto unit = units.find(text.empty() ? ' ' : text.back());
     if (unit == units.end()) {
-        throw CLI::ValidationError("--every", "\"" + text + "\" is not tick, packet or a time "
-                                                             "(30s, 1m, 6h, 1d)");
+        throw CLI::ValidationError("--every", "\"" + text +
+                                                  "\" is not tick, packet or a time "
+                                                  "(30s, 1m, 6h, 1d)");
     }
     constexpr int kMost = 1000;
     return unit->second * numberOf("--every", text.substr(0, text.size() - 1), 1, kMost);
@@ -124,16 +124,13 @@ void addAsking(CLI::App& app, StoreAskOptions& asking) {
         ->type_name("FIELD");
     app.add_option("--below", asking.below, "The border of a bad level (default: of the profile)")
         ->type_name("NUMBER");
-    app.add_option("--entry", asking.entry, "Only this list entry of a series")
-        ->type_name("WORDS");
-    app.add_option("--profile", asking.profile,
-                   "The profile that judges levels (default: android)")
+    app.add_option("--entry", asking.entry, "Only this list entry of a series")->type_name("WORDS");
+    app.add_option("--profile", asking.profile, "The profile that judges levels (default: android)")
         ->type_name("android|field|operator|NAME");
-    addChoice<RowFormat>(app, "--format", asking.format,
-                         {{"table", RowFormat::Table},
-                          {"csv", RowFormat::Csv},
-                          {"json", RowFormat::Json}},
-                         "How to write the rows (default: table)");
+    addChoice<RowFormat>(
+        app, "--format", asking.format,
+        {{"table", RowFormat::Table}, {"csv", RowFormat::Csv}, {"json", RowFormat::Json}},
+        "How to write the rows (default: table)");
     app.add_option_function<std::string>(
            "--timeout",
            [&asking](const std::string& text) {
@@ -176,27 +173,29 @@ ParsedOptions askOptions(const StoreRequest& request) {
         }
         words.erase(words.begin());
         if (words.size() != question.second) {
-            return wrongUsage(formatText("%@ takes %@", {name, question.second == 0   ? "no words"
-                                                               : question.second == 1 ? "a field"
-                                                                                      : "two words"}),
-                              "store");
+            return wrongUsage(
+                formatText("%@ takes %@", {name, question.second == 0   ? "no words"
+                                                 : question.second == 1 ? "a field"
+                                                                        : "two words"}),
+                "store");
         }
         asking.question = question.first;
         asking.words = words;
         return asking;
     }
-    return wrongUsage(words.empty() ? "query takes a question (" + names + ") or --sql"
-                                    : std::string(unknownChoice("query", words.front(), names).what()),
+    return wrongUsage(words.empty()
+                          ? "query takes a question (" + names + ") or --sql"
+                          : std::string(unknownChoice("query", words.front(), names).what()),
                       "store");
 }
 
 } // namespace
 
 void addStore(CLI::App& app, StoreRequest& request) {
-    addChoice<StoreRequest::Action>(app, "ACTION", request.action,
-                                    {{"load", StoreRequest::Action::Load},
-                                     {"query", StoreRequest::Action::Query}},
-                                    "What to do")
+    addChoice<StoreRequest::Action>(
+        app, "ACTION", request.action,
+        {{"load", StoreRequest::Action::Load}, {"query", StoreRequest::Action::Query}},
+        "What to do")
         ->required();
     app.add_option("WORDS", request.words,
                    "The recordings to load (pcap or pcapng), or a question: devices, recordings, "

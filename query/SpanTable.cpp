@@ -57,9 +57,8 @@ public:
         case kField:
             return value.text(_timeline.fields()[span.field].name);
         case kEntry:
-            return span.entry != kNoEntry
-                       ? value.text(_timeline.entries().words(span.entry))
-                       : void();
+            return span.entry != kNoEntry ? value.text(_timeline.entries().words(span.entry))
+                                          : void();
         case kHold:
             return value.integer(microseconds(span.end) - microseconds(span.start));
         case kNumber:

@@ -95,8 +95,8 @@ void IntervalWriter::write(StoreConnection& store, std::int64_t recording, Named
         "INSERT INTO series (recording, field, entry, step, format, first_row, last_row, first, "
         "last) VALUES (?, ?, ?, ?, ?, ?, ?, ?, ?)");
     for (auto from = _rows.begin(); from != _rows.end();) {
-        const auto to = std::find_if(
-            from, _rows.end(), [&](const Row& row) { return row.series != from->series; });
+        const auto to = std::find_if(from, _rows.end(),
+                                     [&](const Row& row) { return row.series != from->series; });
         const Series& series = _series[from->series];
         const FieldInfo& info = _measurements.fields()[series.field];
         const std::int64_t first = rows.last() + 1;
@@ -111,10 +111,9 @@ void IntervalWriter::write(StoreConnection& store, std::int64_t recording, Named
                             : std::nullopt);
             add.bind(6, names.text(info, row.value, series.format));
             add.bind(7, static_cast<std::int64_t>(row.packet));
-            add.bind(8, row.part == Interval::Part::Whole ? std::nullopt
-                        : row.part == Interval::Part::First
-                            ? std::optional(row.whole)
-                            : std::optional<std::int64_t>(-1));
+            add.bind(8, row.part == Interval::Part::Whole   ? std::nullopt
+                        : row.part == Interval::Part::First ? std::optional(row.whole)
+                                                            : std::optional<std::int64_t>(-1));
             add.run();
             end = std::max(end, row.time + row.hold);
         }

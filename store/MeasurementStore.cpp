@@ -50,8 +50,7 @@ std::optional<LoadedRecording> MeasurementStore::withDigest(const std::string& d
 
 std::vector<LoadedRecording> MeasurementStore::beginningAt(const std::string& technology,
                                                            std::int64_t first) {
-    Statement find =
-        _connection->prepare(selectRecordings("first = ? AND technology = ?").c_str());
+    Statement find = _connection->prepare(selectRecordings("first = ? AND technology = ?").c_str());
     find.bind(1, first).bind(2, technology);
     std::vector<LoadedRecording> recordings;
     while (find.step()) {

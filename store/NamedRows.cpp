@@ -89,8 +89,8 @@ std::optional<std::int64_t> NamedRows::text(const FieldInfo& info, const FieldVa
         const std::string text = value.text();
         const Standing standing = standingOf(info, text, value.number, value.raw);
         if (standing != Standing::Value || shown == nullptr || !isFormatted(value, format, text)) {
-            place->second = rowOf({text, shown == nullptr ? value.raw : std::nullopt,
-                                   nameOf(standing)});
+            place->second =
+                rowOf({text, shown == nullptr ? value.raw : std::nullopt, nameOf(standing)});
         }
     }
     return place->second;

@@ -166,8 +166,8 @@ std::optional<std::string> Load::examine() {
     return std::nullopt;
 }
 
-/// Whether the packets so far are those of a recording in the store: it was loaded while it grew, or
-/// from a damaged copy.
+/// Whether the packets so far are those of a recording in the store: it was loaded while it grew,
+/// or from a damaged copy.
 void Load::findShorter(const PacketDigest& digest) {
     for (const LoadedRecording& earlier : _earlier) {
         if (earlier.packets == _recording.packets && earlier.digest == digest.soFar()) {
@@ -191,8 +191,7 @@ std::optional<std::string> Load::reasonToSkip() {
         return formatText("it is in the store, as the later version %@ has read it",
                           {known->decoder});
     }
-    const bool isSame = known->decoder == _recording.decoder &&
-                        known->every == _recording.every &&
+    const bool isSame = known->decoder == _recording.decoder && known->every == _recording.every &&
                         known->identities == _recording.identities;
     return isSame ? std::optional<std::string>("it is in the store") : std::nullopt;
 }
@@ -208,9 +207,9 @@ std::optional<std::string> Load::decode() {
             _intervals->add(interval);
         }
     };
-    _measurements.emplace(DecodingSource{*_technology, _decoder.resources, _decoder.bundle,
-                                         _decoder.technologies},
-                          _request.resolution, take);
+    _measurements.emplace(
+        DecodingSource{*_technology, _decoder.resources, _decoder.bundle, _decoder.technologies},
+        _request.resolution, take);
     _intervals.emplace(*_measurements, _first);
     PacketDigest digest;
     ByteBuffer masked;

@@ -1,11 +1,13 @@
 #include "store/RecordingMeasurements.h"
 
 #include "fields/Measures.h"
+#include "fields/StatusFields.h"
 #include "platform/RecordedTechnology.h"
 #include "platform/SystemLog.h"
 
 #include <algorithm>
 #include <exception>
+#include <map>
 
 namespace pallax {
 
@@ -29,6 +31,7 @@ RecordingMeasurements::RecordingMeasurements(const DecodingSource& source, Resol
       _eventFinder(source.technology.commandName, _fields, _entries), _cells(_fields, _entries),
       _resolution(resolution), _take(std::move(take)) {
     _values.setListener(this);
+    findLevels(source.technology.commandName);
 }
 
 bool RecordingMeasurements::add(const JournalPacket& packet) {
@@ -131,13 +134,40 @@ void RecordingMeasurements::showTick(const TickGrid::Tick& tick) {
     handOut();
 }
 
-bool RecordingMeasurements::isKnown(FieldIndex field, const FieldValue& value, Time now) {
-    _isLevel.resize(std::max<std::size_t>(_isLevel.size(), field + std::size_t{1}));
-    auto& isLevel = _isLevel[field];
-    if (!isLevel) {
-        isLevel = measureOf(_fields[field].name).has_value();
+void RecordingMeasurements::findLevels(std::string_view technology) {
+    for (const MeasuredField& measured : measuredFields()) {
+        if (const auto field = _fields.named(measured.name)) {
+            _levels.resize(std::max<std::size_t>(_levels.size(), *field + std::size_t{1}));
+            _levels[*field].isOne = true;
+        }
     }
-    return !*isLevel || now - value.read <= kLevelHolds;
+    for (const StatusCellFields& cell : statusCells()) {
+        std::map<std::string_view, std::vector<FieldIndex>> byName;
+        for (const StatusField& each : cell.fields) {
+            const auto field = _fields.named(each.field);
+            if (cell.technology == technology && each.role == StatusField::Role::Level && field &&
+                *field < _levels.size()) {
+                byName[each.name].push_back(*field);
+            }
+        }
+        for (const auto& [name, fields] : byName) {
+            for (const FieldIndex field : fields) {
+                _levels[field].others = fields;
+            }
+        }
+    }
+}
+
+bool RecordingMeasurements::isKnown(FieldIndex field, const FieldValue& value, Time now) const {
+    if (field >= _levels.size() || !_levels[field].isOne) {
+        return true;
+    }
+    const auto& others = _levels[field].others;
+    return now - value.read <= kLevelHolds &&
+           std::none_of(others.begin(), others.end(), [&](FieldIndex other) {
+               const FieldValue* its = _values.value(other);
+               return its != nullptr && its->read > value.read;
+           });
 }
 
 void RecordingMeasurements::noteServing(std::uint64_t packet, Time time) {

@@ -52,7 +52,8 @@ struct Interval {
 /// packet once, quietly.
 class RecordingMeasurements final : private CurrentValues::Listener {
 public:
-    /// A level that was read longer ago is not known any more, at ticks.
+    /// A level that was read longer ago is not known any more, at ticks. Of levels that tell the
+    /// same, only the one that was read last is known.
     static constexpr std::chrono::seconds kLevelHolds{10};
 
     using Take = std::function<void(const Interval& interval)>;
@@ -85,7 +86,8 @@ private:
     void listReplaced(ListId list) override;
     void noteStep(const JournalPacket& packet);
     void showTick(const TickGrid::Tick& tick);
-    bool isKnown(FieldIndex field, const FieldValue& value, Time now);
+    void findLevels(std::string_view technology);
+    bool isKnown(FieldIndex field, const FieldValue& value, Time now) const;
     void noteServing(std::uint64_t packet, Time time);
     void handOut();
     void divide(const Span& span);
@@ -106,7 +108,11 @@ private:
     std::vector<SampleReader::Item> _items;
     bool _mayNameCell = false;
     std::vector<Served> _served;
-    std::vector<std::optional<bool>> _isLevel; ///< by field
+    struct Level {
+        bool isOne = false;
+        std::vector<FieldIndex> others; ///< which tell the same of the serving cell
+    };
+    std::vector<Level> _levels; ///< by field
     std::vector<Event> _events;
 };
 

@@ -147,8 +147,8 @@ void StoreConnection::Close::operator()(sqlite3* connection) const {
 StoreConnection::StoreConnection(std::string file, Mode mode) : _file(std::move(file)) {
     sqlite3* connection = nullptr;
     const int flags = mode == Mode::Read ? SQLITE_OPEN_READONLY : SQLITE_OPEN_READWRITE;
-    const int code = sqlite3_open_v2(fileName(_file).c_str(), &connection,
-                                     flags | SQLITE_OPEN_NOMUTEX, nullptr);
+    const int code =
+        sqlite3_open_v2(fileName(_file).c_str(), &connection, flags | SQLITE_OPEN_NOMUTEX, nullptr);
     _connection.reset(connection);
     if (code != SQLITE_OK) {
         throw StoreFailure(sentenceOf(_file, connection, code));

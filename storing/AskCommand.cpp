@@ -78,9 +78,9 @@ private:
     }
     std::optional<std::string> findField(const std::string& name) {
         const std::string end = quotedText("." + name);
-        const auto found = textsOf(_database, "SELECT name FROM field WHERE name = " +
-                                                  quotedText(name) + " OR substr(name, -length(" +
-                                                  end + ")) = " + end);
+        const auto found =
+            textsOf(_database, "SELECT name FROM field WHERE name = " + quotedText(name) +
+                                   " OR substr(name, -length(" + end + ")) = " + end);
         if (found.size() == 1) {
             _levels.push_back({found.front(), found.front(), {}});
             return std::nullopt;
@@ -100,9 +100,9 @@ private:
         const bool isKnown =
             std::find(devices.begin(), devices.end(), *_options.device) != devices.end();
         return isKnown ? std::nullopt
-                       : std::optional(formatText("The store has no device \"%@\"%@.",
-                                                  {*_options.device,
-                                                   suggestion(*_options.device, devices)}));
+                       : std::optional(
+                             formatText("The store has no device \"%@\"%@.",
+                                        {*_options.device, suggestion(*_options.device, devices)}));
     }
 
     const StoreAskOptions& _options;

@@ -76,8 +76,8 @@ private:
             },
             [this] { _progress.look(); });
         ExitStatus status = kExitSuccess;
-        const auto error = workers.run(
-            [&](std::size_t recording, const auto& outcome, const WorkerFiles& files) {
+        const auto error =
+            workers.run([&](std::size_t recording, const auto& outcome, const WorkerFiles& files) {
                 status = std::max(status, collect(recording, outcome, files));
                 return !outcome.gaveUp;
             });

@@ -70,8 +70,8 @@ Loading::Loading(const LoadingOptions& options)
 
 ExitStatus Loading::load(const std::string& path, const Seams& seams) {
     MeasurementStore store(_file);
-    const LoadOutcome outcome = loadRecording(path, requestOf(seams),
-                                              {_resources, _bundle, technologies()}, store);
+    const LoadOutcome outcome =
+        loadRecording(path, requestOf(seams), {_resources, _bundle, technologies()}, store);
     if (outcome.kind == LoadOutcome::Kind::Refused) {
         seams.complain(outcome.reason);
         return kExitFailure;

@@ -34,7 +34,6 @@ public:
     ExitStatus load(const std::string& path, const Seams& seams);
 
 private:
-
     LoadRequest requestOf(const Seams& seams);
     LoadRequest::Mask maskOf(const RecordedTechnology& technology);
 

@@ -5,8 +5,8 @@
 #include "text/Format.h"
 
 #include <algorithm>
-#include <charconv>
 #include <array>
+#include <charconv>
 
 namespace pallax {
 
@@ -46,16 +46,16 @@ std::string onlyDevice(const StoreAskOptions& options) {
 std::string levelTable(const std::vector<JudgedLevel>& levels) {
     std::string rows;
     for (const JudgedLevel& level : levels) {
-        rows += formatText("%@(%@, %@, %@, %@)",
-                           {rows.empty() ? "" : ", ", quotedText(level.field),
-                            quotedText(level.name),
-                            level.border ? numberText(*level.border) : std::string("NULL"),
-                            level.isSmallerBetter ? "-1" : "1"});
+        rows +=
+            formatText("%@(%@, %@, %@, %@)",
+                       {rows.empty() ? "" : ", ", quotedText(level.field), quotedText(level.name),
+                        level.border ? numberText(*level.border) : std::string("NULL"),
+                        level.isSmallerBetter ? "-1" : "1"});
     }
     return "WITH level(field, level, border, sign) AS (VALUES " + rows + ")\n";
 }
 
-constexpr const char* kHours = "round(sum(hold) / 3.6e9, 2)";
+constexpr const char* kHours = "round(sum(hold) / 3.6e9, 3)";
 constexpr const char* kShareBelow =
     "round(100.0 * sum(CASE WHEN number * sign < border * sign THEN hold ELSE 0 END) / sum(hold), "
     "1)";
@@ -98,30 +98,43 @@ std::string compareQuery(const StoreAskOptions& options, const std::vector<Judge
 }
 
 std::string seriesQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
-    const auto step =
-        std::chrono::duration_cast<std::chrono::microseconds>(options.every).count();
+    const auto step = std::chrono::duration_cast<std::chrono::microseconds>(options.every).count();
     const std::string entry =
         options.entry ? " AND entry = " + quotedText(*options.entry) : std::string();
     const std::string text = std::to_string(step);
     // Each interval is divided where steps begin.
     return "WITH RECURSIVE part(device, entry, step, start, stop, number) AS (\n"
-           "SELECT device, entry, start / " + text + ", start, start + hold, number\n"
-           "FROM measurement WHERE field = " + quotedText(levels.front().field) +
-           " AND number IS NOT NULL AND hold > 0" + onlyDevice(options) + entry + "\n"
-           "UNION ALL SELECT device, entry, step + 1, (step + 1) * " + text + ", stop, number\n"
-           "FROM part WHERE stop > (step + 1) * " + text + "),\n"
-           "held AS (SELECT device, entry, step, number, min(stop, (step + 1) * " + text + ") - "
+           "SELECT device, entry, start / " +
+           text +
+           ", start, start + hold, number\n"
+           "FROM measurement WHERE field = " +
+           quotedText(levels.front().field) + " AND number IS NOT NULL AND hold > 0" +
+           onlyDevice(options) + entry +
+           "\n"
+           "UNION ALL SELECT device, entry, step + 1, (step + 1) * " +
+           text +
+           ", stop, number\n"
+           "FROM part WHERE stop > (step + 1) * " +
+           text +
+           "),\n"
+           "held AS (SELECT device, entry, step, number, min(stop, (step + 1) * " +
+           text +
+           ") - "
            "start AS hold FROM part)\n"
-           "SELECT time_text(step * " + text + ") AS time, device, entry, min(number) AS least, "
+           "SELECT time_text(step * " +
+           text +
+           ") AS time, device, entry, min(number) AS least, "
            "round(sum(number * hold) / sum(hold), 2) AS mean, max(number) AS greatest, "
-           "round(100.0 * sum(hold) / " + text + ", 1) AS known_percent\n"
+           "round(100.0 * sum(hold) / " +
+           text +
+           ", 1) AS known_percent\n"
            "FROM held GROUP BY device, entry, step ORDER BY device, entry, step";
 }
 
 std::string coverageQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
     std::string grades;
-    for (const Grade grade : {Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor,
-                              Grade::None}) {
+    for (const Grade grade :
+         {Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor, Grade::None}) {
         const std::string name(nameOf(grade));
         grades += ", round(100.0 * sum(CASE grade WHEN '" + name +
                   "' THEN hold ELSE 0 END) / sum(hold), 1) AS " + name;
@@ -151,9 +164,8 @@ std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<d
                                       const QualityProfile& profile) {
     std::vector<JudgedLevel> levels;
     const auto add = [&](std::string_view field, std::string_view name) {
-        const bool isKnown = std::any_of(levels.begin(), levels.end(), [&](const auto& level) {
-            return level.field == field;
-        });
+        const bool isKnown = std::any_of(levels.begin(), levels.end(),
+                                         [&](const auto& level) { return level.field == field; });
         const auto measure = measureOf(field);
         if (measure && !isKnown) {
             levels.push_back(judged(field, name, *measure, below, profile));
@@ -183,7 +195,7 @@ std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLeve
     switch (options.question) {
     case StoreAskOptions::Question::Devices:
         return "SELECT device, count(*) AS recordings, time_text(min(first) * 1000) AS first, "
-               "time_text(max(last) * 1000) AS last, round(sum(last - first) / 3.6e6, 2) AS hours, "
+               "time_text(max(last) * 1000) AS last, round(sum(last - first) / 3.6e6, 3) AS hours, "
                "sum(packets) AS packets FROM recordings WHERE true" +
                onlyDevice(options) + " GROUP BY device ORDER BY device";
     case StoreAskOptions::Question::Recordings:

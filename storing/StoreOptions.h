@@ -14,8 +14,8 @@ namespace pallax {
 
 /// How `pallax store load` and `pallax store watch` bring recordings into a store.
 struct LoadingOptions {
-    std::string store;                       ///< a file; empty: the usual one
-    std::optional<std::string> device = {};  ///< nothing: the name of a recording's folder
+    std::string store;                      ///< a file; empty: the usual one
+    std::optional<std::string> device = {}; ///< nothing: the name of a recording's folder
     Resolution resolution = Resolution::Tick;
     std::string keyFile = {}; ///< of pseudonyms; empty: identities are left out
 };
@@ -36,8 +36,8 @@ struct StoreAskOptions {
     /// The field of a series, the two that are compared, or the query.
     std::vector<std::string> words = {};
     std::optional<std::string> device = {};
-    std::string levels = {};           ///< a field or a measure; empty: of the serving cells
-    std::optional<double> below = {};  ///< nothing: where the grade "fair" ends
+    std::string levels = {};          ///< a field or a measure; empty: of the serving cells
+    std::optional<double> below = {}; ///< nothing: where the grade "fair" ends
     std::string profile{kDefaultProfile};
     std::chrono::nanoseconds every = std::chrono::minutes(1); ///< of a series
     std::optional<std::string> entry = {};                    ///< of a series

@@ -15,13 +15,13 @@ struct Span {
     EntryId entry = kNoEntry;
     FieldValue value;
     std::uint64_t packet = 0; ///< in which it was read first
-    std::uint32_t place = 0; ///< of that reading in the packet, as the caller counts
+    std::uint32_t place = 0;  ///< of that reading in the packet, as the caller counts
     Time start;
     Time end; ///< not before `start`
 };
 
-/// Joins readings of the same value to spans. A span ends when another value is read, when the field
-/// or the entry is gone, and where the caller says that what follows does not continue it.
+/// Joins readings of the same value to spans. A span ends when another value is read, when the
+/// field or the entry is gone, and where the caller says that what follows does not continue it.
 class SpanMaker {
 public:
     /// The readings that follow are those of this packet.

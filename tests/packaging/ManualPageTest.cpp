@@ -35,7 +35,8 @@ TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
                   "pallax", "pallax-decode", "pallax-record", "pallax-service", "pallax-demo",
                   "pallax-modem", "pallax-simulate", "pallax-events", "pallax-fields",
                   "pallax-explain", "pallax-info", "pallax-snapshot", "pallax-sql", "pallax-status",
-                  "pallax-diff", "pallax-watch", "pallax-mask", "pallax-verify"}));
+                  "pallax-diff", "pallax-watch", "pallax-report", "pallax-web", "pallax-mask",
+                  "pallax-verify", "pallax-store"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 

@@ -1,6 +1,5 @@
-#include "tests/store/StoreFixture.h"
-
 #include "tests/doubles/Files.h"
+#include "tests/store/StoreFixture.h"
 
 #include <filesystem>
 #include <fstream>
@@ -136,9 +135,8 @@ TEST_F(RecordingLoadTest, AFullDiskLeavesTheStoreAsItWas) {
     const std::string path = write("other.pcap");
     MeasurementStore store(file);
     store.connection().run("PRAGMA max_page_count = 1");
-    EXPECT_THROW(
-        (void)loadRecording(path, request(), {resources, bundle, technologies()}, store),
-        StoreFailure);
+    EXPECT_THROW((void)loadRecording(path, request(), {resources, bundle, technologies()}, store),
+                 StoreFailure);
     EXPECT_EQ(content(), before);
 }
 
