@@ -42,8 +42,8 @@ void bindNumber(Statement& statement, int parameter, const FieldValue& value, bo
 class IntervalRows {
 public:
     explicit IntervalRows(StoreConnection& store)
-        : _add(store.prepare("INSERT INTO intervals (id, time, hold, number, site, text, packet, "
-                             "whole) VALUES (?, ?, ?, ?, ?, ?, ?, ?)")) {
+        : _add(store.prepare("INSERT INTO intervals (id, time, hold, number, text, packet, "
+                             "whole) VALUES (?, ?, ?, ?, ?, ?, ?)")) {
         Statement last = store.prepare("SELECT coalesce(max(id), 0) FROM intervals");
         last.step();
         _last = last.integer(0);
@@ -63,16 +63,13 @@ private:
 } // namespace
 
 void IntervalWriter::add(const Interval& interval) {
-    constexpr unsigned kHalf = 32;
-    const std::uint64_t key = std::uint64_t{interval.field} << kHalf | interval.entry;
-    const auto [place, isNew] =
-        _places.try_emplace(key, static_cast<std::uint32_t>(_series.size()));
+    const auto [place, isNew] = _places.try_emplace({interval.field, interval.entry, interval.cell},
+                                                    static_cast<std::uint32_t>(_series.size()));
     if (isNew) {
-        _series.push_back({interval.field, interval.entry});
+        _series.push_back({interval.field, interval.entry, interval.cell});
     }
     noteFormat(_series[place->second], interval.value);
-    const auto cell = interval.cell ? static_cast<std::int64_t>(*interval.cell) : -1;
-    _rows.push_back({place->second, interval.part, cell, millisecondsSince(_first, interval.start),
+    _rows.push_back({place->second, interval.part, millisecondsSince(_first, interval.start),
                      interval.hold.count(), interval.whole.count(), interval.packet,
                      interval.value});
     ++_count;
@@ -92,47 +89,62 @@ void IntervalWriter::write(StoreConnection& store, std::int64_t recording, Named
     });
     IntervalRows rows(store);
     Statement addSeries = store.prepare(
-        "INSERT INTO series (recording, field, entry, step, format, first_row, last_row, first, "
-        "last) VALUES (?, ?, ?, ?, ?, ?, ?, ?, ?)");
+        "INSERT INTO series (recording, field, entry, site, step, format, first_row, last_row, "
+        "first, last) VALUES (?, ?, ?, ?, ?, ?, ?, ?, ?, ?)");
+    addSeries.bind(1, recording);
     for (auto from = _rows.begin(); from != _rows.end();) {
         const auto to = std::find_if(from, _rows.end(),
                                      [&](const Row& row) { return row.series != from->series; });
         const Series& series = _series[from->series];
-        const FieldInfo& info = _measurements.fields()[series.field];
-        const std::int64_t first = rows.last() + 1;
+        addSeries.bind(7, rows.last() + 1);
         std::int64_t end = 0;
         for (const Row& row : std::span(from, to)) {
-            Statement& add = rows.next();
-            add.bind(2, row.time).bind(3, row.hold);
-            bindNumber(add, 4, row.value, series.isReal);
-            add.bind(5, row.cell >= 0
-                            ? std::optional(names.site(
-                                  _measurements.cells()[static_cast<std::size_t>(row.cell)]))
-                            : std::nullopt);
-            add.bind(6, names.text(info, row.value, series.format));
-            add.bind(7, static_cast<std::int64_t>(row.packet));
-            add.bind(8, row.part == Interval::Part::Whole   ? std::nullopt
-                        : row.part == Interval::Part::First ? std::optional(row.whole)
-                                                            : std::optional<std::int64_t>(-1));
-            add.run();
+            write(row, series, names, rows.next());
             end = std::max(end, row.time + row.hold);
         }
-        addSeries.bind(1, recording).bind(2, names.field(info));
-        addSeries.bind(3, series.entry != kNoEntry
-                              ? std::optional(_measurements.entries().words(series.entry))
-                              : std::nullopt);
-        if (series.isReal) {
-            addSeries.bind(4, 1 / kStepsOfReal);
-        } else {
-            addSeries.bind(4, std::int64_t{1});
-        }
-        addSeries.bind(5, series.format).bind(6, first).bind(7, rows.last());
-        addSeries.bind(8, from->time).bind(9, end).run();
+        addSeries.bind(8, rows.last()).bind(9, from->time).bind(10, end);
+        write(series, names, addSeries);
         from = to;
     }
     _rows.clear();
     _series.clear();
     _places.clear();
+}
+
+void IntervalWriter::write(const Row& row, const Series& series, NamedRows& names,
+                           Statement& add) const {
+    add.bind(2, row.time).bind(3, row.hold);
+    bindNumber(add, 4, row.value, series.isReal);
+    add.bind(5, names.text(_measurements.fields()[series.field], row.value, series.format));
+    add.bind(6, static_cast<std::int64_t>(row.packet));
+    switch (row.part) {
+    case Interval::Part::Whole:
+        add.bindNull(7);
+        break;
+    case Interval::Part::First:
+        add.bind(7, row.whole);
+        break;
+    case Interval::Part::Continued:
+        add.bind(7, std::int64_t{-1});
+        break;
+    }
+    add.run();
+}
+
+void IntervalWriter::write(const Series& series, NamedRows& names, Statement& add) const {
+    const FieldInfo& info = _measurements.fields()[series.field];
+    add.bind(2, names.field(info));
+    add.bind(3, series.entry != kNoEntry
+                    ? std::optional(_measurements.entries().words(series.entry))
+                    : std::nullopt);
+    add.bind(4, series.cell ? std::optional(names.site(_measurements.cells()[*series.cell]))
+                            : std::nullopt);
+    if (series.isReal) {
+        add.bind(5, 1 / kStepsOfReal);
+    } else {
+        add.bind(5, std::int64_t{1});
+    }
+    add.bind(6, series.format).run();
 }
 
 } // namespace pallax

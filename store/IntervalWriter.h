@@ -6,8 +6,10 @@
 #include <cstddef>
 #include <cstdint>
 #include <functional>
+#include <map>
+#include <optional>
 #include <string>
-#include <unordered_map>
+#include <tuple>
 #include <vector>
 
 namespace pallax {
@@ -35,7 +37,6 @@ private:
     struct Row {
         std::uint32_t series;
         Interval::Part part;
-        std::int64_t cell; ///< -1: unknown
         std::int64_t time;
         std::int64_t hold;
         std::int64_t whole;
@@ -45,18 +46,21 @@ private:
     struct Series {
         FieldIndex field = 0;
         EntryId entry = kNoEntry;
+        std::optional<std::size_t> cell = {};
         std::string format = {}; ///< of its first number
         bool isReal = false;
     };
 
     void noteFormat(Series& series, const FieldValue& value);
+    void write(const Row& row, const Series& series, NamedRows& names, Statement& add) const;
+    void write(const Series& series, NamedRows& names, Statement& add) const;
 
     const RecordingMeasurements& _measurements;
     Time _first;
     std::uint64_t _count = 0;
     std::vector<Row> _rows;
     std::vector<Series> _series;
-    std::unordered_map<std::uint64_t, std::uint32_t> _places; ///< by field and entry
+    std::map<std::tuple<FieldIndex, EntryId, std::optional<std::size_t>>, std::uint32_t> _places;
 };
 
 } // namespace pallax

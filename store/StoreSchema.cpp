@@ -50,14 +50,15 @@ CREATE TABLE sites (
 );
 
 CREATE TABLE series (
-    -- The intervals of a field and entry in a recording, or in a part of a long one. They are in
-    -- the rows from first_row to last_row in the order of their times, so that an interval need not
-    -- say to what it belongs, new rows only ever come at the end, and a recording is removed by
-    -- ranges.
+    -- The intervals of a field and entry in one serving cell, in a recording or in a part of a long
+    -- one. They are in the rows from first_row to last_row in the order of their times, so that an
+    -- interval need not say to what it belongs, new rows only ever come at the end, a recording is
+    -- removed by ranges, and cells are compared without sorting.
     id INTEGER PRIMARY KEY,
     recording INTEGER NOT NULL REFERENCES recordings,
     field INTEGER NOT NULL REFERENCES fields,
     entry TEXT,
+    site INTEGER REFERENCES sites, -- the serving cell; NULL: not known yet
     step,        -- whole numbers of intervals count steps of this size
     format TEXT, -- of numbers
     first_row INTEGER NOT NULL,
@@ -67,14 +68,14 @@ CREATE TABLE series (
 );
 CREATE INDEX series_of_field ON series (field, recording);
 CREATE INDEX series_of_recording ON series (recording);
+CREATE INDEX series_of_site ON series (site, field);
 
 CREATE TABLE intervals (
-    -- A value for as long as it held in one serving cell: most numbers take two bytes.
+    -- A value for as long as it held: most numbers take two bytes.
     id INTEGER PRIMARY KEY,
     time INTEGER NOT NULL, -- milliseconds since the recording's first packet
     hold INTEGER NOT NULL, -- milliseconds
     number,                -- in steps if it is whole; NULL: a text, or no value
-    site INTEGER,          -- the serving cell; NULL: not known yet
     text INTEGER,          -- NULL: the number in the format of the series
     packet INTEGER NOT NULL,
     whole INTEGER          -- where cells divide the time of a value: all of its milliseconds in the
@@ -122,7 +123,7 @@ CREATE VIEW measurement AS
         CROSS JOIN recordings r ON r.id = s.recording
         CROSS JOIN intervals i ON i.id BETWEEN s.first_row AND s.last_row
         LEFT JOIN texts t ON t.id = i.text
-        LEFT JOIN sites p ON p.id = i.site;
+        LEFT JOIN sites p ON p.id = s.site;
 
 CREATE VIEW span AS
     -- As in pallax sql: the time of a value is whole, whichever cells it was in.
