@@ -82,7 +82,7 @@ private:
             textsOf(_database, "SELECT name FROM field WHERE name = " + quotedText(name) +
                                    " OR substr(name, -length(" + end + ")) = " + end);
         if (found.size() == 1) {
-            _levels.push_back({found.front(), found.front(), {}});
+            _levels.push_back({found.front(), {found.front()}, {}, {}});
             return std::nullopt;
         }
         if (!found.empty()) {

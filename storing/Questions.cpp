@@ -2,6 +2,7 @@
 
 #include "fields/Measures.h"
 #include "fields/StatusFields.h"
+#include "text/Date.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -22,13 +23,13 @@ bool isEndOf(const std::string& words, std::string_view field) {
     return field == words || field.ends_with("." + words);
 }
 
-JudgedLevel judged(std::string_view field, std::string_view name, Measure measure,
-                   std::optional<double> below, const QualityProfile& profile) {
-    JudgedLevel level{std::string(field), std::string(name), below};
+JudgedLevel judged(std::string name, Measure measure, std::optional<double> below,
+                   const QualityProfile& profile) {
+    JudgedLevel level{std::move(name), {}, {}, below};
     const auto borders = profile.borders.find(measure);
     if (borders != profile.borders.end()) {
-        level.isSmallerBetter = borders->second.isSmallerBetter();
-        for (const Borders::Border& border : borders->second.borders) {
+        level.borders = borders->second;
+        for (const Borders::Border& border : level.borders.borders) {
             if (!below && border.grade >= Grade::Fair) {
                 level.border = border.value;
             }
@@ -37,117 +38,190 @@ JudgedLevel judged(std::string_view field, std::string_view name, Measure measur
     return level;
 }
 
-/// "AND device = 'car1'", with the name of the column.
+/// " AND r.device = 'car1'".
 std::string onlyDevice(const StoreAskOptions& options) {
-    return options.device ? " AND device = " + quotedText(*options.device) : "";
+    return options.device ? " AND r.device = " + quotedText(*options.device) : "";
 }
 
-/// A common table of the levels: field, level, border and the sign that makes greater better.
-std::string levelTable(const std::vector<JudgedLevel>& levels) {
-    std::string rows;
-    for (const JudgedLevel& level : levels) {
-        rows +=
-            formatText("%@(%@, %@, %@, %@)",
-                       {rows.empty() ? "" : ", ", quotedText(level.field), quotedText(level.name),
-                        level.border ? numberText(*level.border) : std::string("NULL"),
-                        level.isSmallerBetter ? "-1" : "1"});
+/// Where a grade or a better one ends; NULL if there is none.
+std::string borderOf(const JudgedLevel& level, Grade grade) {
+    std::string text = "NULL";
+    for (const Borders::Border& border : level.borders.borders) { // the best first
+        if (border.grade >= grade) {
+            text = numberText(border.value);
+        }
     }
-    return "WITH level(field, level, border, sign) AS (VALUES " + rows + ")\n";
+    return text;
 }
 
-constexpr const char* kHours = "round(sum(hold) / 3.6e9, 3)";
+/// Common tables: `level` has each level with its borders and the sign that makes a greater value
+/// better, `member` its fields.
+std::string levelTables(const std::vector<JudgedLevel>& levels) {
+    std::string rows;
+    std::string members;
+    for (std::size_t index = 0; index < levels.size(); ++index) {
+        const JudgedLevel& level = levels[index];
+        const std::string number = std::to_string(index + 1);
+        rows.append(rows.empty() ? "(" : ", (").append(number);
+        rows.append(", ").append(quotedText(level.name)).append(", ");
+        rows.append(level.border ? numberText(*level.border) : "NULL");
+        rows.append(level.borders.isSmallerBetter() ? ", -1" : ", 1");
+        for (const Grade grade : {Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor}) {
+            rows.append(", ").append(borderOf(level, grade));
+        }
+        rows += ")";
+        for (const std::string& field : level.fields) {
+            members.append(members.empty() ? "(" : ", (").append(number).append(", ");
+            members.append(quotedText(field)).append(")");
+        }
+    }
+    return "WITH level(n, level, border, sign, excellent, good, fair, poor) AS (VALUES " + rows +
+           "),\nnamed(n, name) AS (VALUES " + members +
+           "),\nmember AS (SELECT n, id AS field FROM named JOIN fields USING (name)),\n";
+}
+
+/// The values of the current level that a condition leaves.
+std::string levelValues(const std::string& condition) {
+    return "FROM (SELECT i.hold, CASE typeof(i.number) WHEN 'integer' THEN i.number * s.step ELSE "
+           "i.number END AS number, (r.first + i.time) * 1000 AS start\n"
+           "FROM member m CROSS JOIN series s ON s.field = m.field "
+           "CROSS JOIN recordings r ON r.id = s.recording "
+           "CROSS JOIN intervals i ON i.id BETWEEN s.first_row AND s.last_row\n"
+           "WHERE m.n = l.n AND i.number IS NOT NULL AND i.hold > 0" +
+           condition + ")";
+}
+
+// Several sums of one pass over the values, as elements of a JSON array.
+constexpr const char* kSummary =
+    "SELECT json_array(sum(hold), sum(CASE WHEN number * sign < border * sign THEN hold ELSE 0 "
+    "END), min(CASE WHEN number * sign < border * sign THEN start END), "
+    "quantile(number, hold, 0.05), quantile(number, hold, 0.5), quantile(number, hold, 0.95))\n";
+constexpr const char* kHours = "round((summary ->> 0) / 3.6e6, 3) AS hours";
 constexpr const char* kShareBelow =
-    "round(100.0 * sum(CASE WHEN number * sign < border * sign THEN hold ELSE 0 END) / sum(hold), "
-    "1)";
-constexpr const char* kQuantiles = "quantile(number, hold, 0.05) AS p5, "
-                                   "quantile(number, hold, 0.5) AS p50, "
-                                   "quantile(number, hold, 0.95) AS p95";
+    "round(100.0 * (summary ->> 1) / (summary ->> 0), 1) AS below_percent";
+constexpr const char* kQuantiles =
+    "summary ->> 3 AS p5, summary ->> 4 AS p50, summary ->> 5 AS p95";
 
 std::string cellsQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
-    return levelTable(levels) +
-           formatText("SELECT system, cell, level, count(DISTINCT device) AS devices, %@ AS hours, "
-                      "border, %@ AS below_percent, time_text(min(CASE WHEN number * sign < "
-                      "border * sign THEN start END)) AS since, %@\n"
-                      "FROM level JOIN measurement USING (field)\n"
-                      "WHERE cell IS NOT NULL AND number IS NOT NULL AND hold > 0%@\n"
-                      "GROUP BY system, cell, level\n"
-                      "ORDER BY below_percent DESC, hours DESC, system, cell",
-                      {kHours, kShareBelow, kQuantiles, onlyDevice(options)});
-}
-
-std::string compareQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
-    const auto is = [](const std::string& word) {
-        return formatText("%@ IN (device, recording, substr(time_text(start), 1, 10))",
-                          {quotedText(word)});
-    };
-    const std::string& one = options.words.at(0);
-    const std::string& other = options.words.at(1);
-    return levelTable(levels) +
-           formatText(
-               ", side AS (SELECT 1 AS side, %@ AS name UNION ALL SELECT 2, %@),\n"
-               "part AS (SELECT side, level, number, hold, border, sign FROM level JOIN "
-               "measurement USING (field) JOIN side ON CASE side WHEN 1 THEN %@ ELSE %@ END\n"
-               "WHERE number IS NOT NULL AND hold > 0%@),\n",
-               {quotedText(one), quotedText(other), is(one), is(other), onlyDevice(options)}) +
-           formatText("row AS (SELECT side, level, %@ AS hours, %@ AS below_percent, %@\n"
-                      "FROM part GROUP BY level, side)\n"
-                      "SELECT level, name, hours, below_percent, p5, p50, p95,\n"
-                      "round(p50 - lag(p50) OVER (PARTITION BY level ORDER BY side), 2) AS change\n"
-                      "FROM row JOIN side USING (side) ORDER BY level, side",
+    return levelTables(levels) +
+           formatText("judged AS MATERIALIZED (SELECT p.system, p.identity AS cell, l.level, "
+                      "l.border, (SELECT count(DISTINCT r.device) FROM member m JOIN series s ON "
+                      "s.site = p.id AND s.field = m.field JOIN recordings r ON r.id = s.recording "
+                      "WHERE m.n = l.n%@) AS devices,\n(%@%@) AS summary\n"
+                      "FROM sites p CROSS JOIN level l)\n",
+                      {onlyDevice(options), kSummary,
+                       levelValues(" AND s.site = p.id" + onlyDevice(options))}) +
+           formatText("SELECT system, cell, level, devices, %@, border, %@, "
+                      "time_text(summary ->> 2) AS since, %@\n"
+                      "FROM judged WHERE summary ->> 0 > 0\n"
+                      "ORDER BY below_percent DESC, hours DESC, system, cell, level",
                       {kHours, kShareBelow, kQuantiles});
 }
 
+/// Whether a row is of a device, a recording or a day with this name.
+std::string isOf(const std::string& word, const std::string& milliseconds) {
+    const std::string name = quotedText(word);
+    const std::string names = name + " IN (r.device, r.name)";
+    if (!parseIsoDate(word + "T00:00:00Z")) {
+        return names;
+    }
+    return formatText("(%@ OR %@ / 86400000 = unixepoch(%@) / 86400)", {names, milliseconds, name});
+}
+
+/// Levels, and events by the hour of what was recorded.
+std::string compareQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+    std::string summaries;
+    std::string events;
+    for (std::size_t side = 0; side < options.words.size(); ++side) {
+        const std::string number = std::to_string(side + 1);
+        const std::string& word = options.words[side];
+        summaries += formatText(
+            "%@SELECT l.n, %@ AS side, l.level AS what, (%@%@) AS summary FROM level l",
+            {side == 0 ? "" : " UNION ALL ", number, kSummary,
+             levelValues(" AND " + isOf(word, "(r.first + i.time)") + onlyDevice(options))});
+        events += formatText("%@SELECT %@ AS side, kind, count(*) AS times FROM recordings r JOIN "
+                             "events e ON e.recording = r.id WHERE %@%@ GROUP BY kind",
+                             {side == 0 ? "" : " UNION ALL ", number, isOf(word, "e.time / 1000"),
+                              onlyDevice(options)});
+    }
+    return levelTables(levels) +
+           formatText("summed AS MATERIALIZED (%@),\nhappened AS MATERIALIZED (%@),\n",
+                      {summaries, events}) +
+           formatText("name(side, name) AS (VALUES (1, %@), (2, %@)),\n"
+                      "known AS (SELECT side, max(summary ->> 0) / 3.6e6 AS hours FROM summed "
+                      "GROUP BY side),\n",
+                      {quotedText(options.words.at(0)), quotedText(options.words.at(1))}) +
+           formatText("both AS (SELECT n, side, what, %@, %@, %@, NULL AS per_hour, summary ->> 4 "
+                      "AS middle FROM summed WHERE summary ->> 0 > 0\nUNION ALL "
+                      "SELECT 1000, side, kind, round(hours, 3), NULL, NULL, NULL, NULL, "
+                      "round(times / hours, 2), round(times / hours, 2) FROM happened JOIN known "
+                      "USING (side))\n",
+                      {kHours, kShareBelow, kQuantiles}) +
+           "SELECT what, name, hours, below_percent, p5, p50, p95, per_hour, round(middle - "
+           "lag(middle) OVER (PARTITION BY n, what ORDER BY side), 2) AS change\n"
+           "FROM both JOIN name USING (side) ORDER BY n, what, side";
+}
+
+/// The few intervals that are in several steps are divided where these begin.
+constexpr const char* kSeries =
+    R"(WITH RECURSIVE part(device, entry, step, start, stop, number) AS (
+    SELECT device, entry, start / STEP, start, start + hold, number
+        FROM VALUES AND start / STEP < (start + hold - 1) / STEP
+    UNION ALL SELECT device, entry, step + 1, (step + 1) * STEP, stop, number
+        FROM part WHERE stop > (step + 1) * STEP),
+held AS (
+    SELECT device, entry, step, number, min(stop, (step + 1) * STEP) - start AS hold FROM part
+    UNION ALL SELECT device, entry, start / STEP, number, hold
+        FROM VALUES AND start / STEP = (start + hold - 1) / STEP)
+SELECT time_text(step * STEP) AS time, device, entry, min(number) AS least,
+    round(sum(number * hold) / sum(hold), 2) AS mean, max(number) AS greatest,
+    round(100.0 * sum(hold) / STEP, 1) AS known_percent
+FROM held GROUP BY device, entry, step ORDER BY device, entry, step)";
+
+/// The text with each such word replaced.
+std::string replaced(std::string_view text, std::string_view word, const std::string& by) {
+    std::string result;
+    for (std::size_t at = text.find(word); at != std::string_view::npos; at = text.find(word)) {
+        result.append(text.substr(0, at)).append(by);
+        text.remove_prefix(at + word.size());
+    }
+    return result.append(text);
+}
+
 std::string seriesQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
-    const auto step = std::chrono::duration_cast<std::chrono::microseconds>(options.every).count();
-    const std::string entry =
-        options.entry ? " AND entry = " + quotedText(*options.entry) : std::string();
-    const std::string text = std::to_string(step);
-    // Each interval is divided where steps begin.
-    return "WITH RECURSIVE part(device, entry, step, start, stop, number) AS (\n"
-           "SELECT device, entry, start / " +
-           text +
-           ", start, start + hold, number\n"
-           "FROM measurement WHERE field = " +
-           quotedText(levels.front().field) + " AND number IS NOT NULL AND hold > 0" +
-           onlyDevice(options) + entry +
-           "\n"
-           "UNION ALL SELECT device, entry, step + 1, (step + 1) * " +
-           text +
-           ", stop, number\n"
-           "FROM part WHERE stop > (step + 1) * " +
-           text +
-           "),\n"
-           "held AS (SELECT device, entry, step, number, min(stop, (step + 1) * " +
-           text +
-           ") - "
-           "start AS hold FROM part)\n"
-           "SELECT time_text(step * " +
-           text +
-           ") AS time, device, entry, min(number) AS least, "
-           "round(sum(number * hold) / sum(hold), 2) AS mean, max(number) AS greatest, "
-           "round(100.0 * sum(hold) / " +
-           text +
-           ", 1) AS known_percent\n"
-           "FROM held GROUP BY device, entry, step ORDER BY device, entry, step";
+    const std::string values =
+        "measurement WHERE field = " + quotedText(levels.front().fields.front()) +
+        " AND number IS NOT NULL AND hold > 0" +
+        (options.device ? " AND device = " + quotedText(*options.device) : "") +
+        (options.entry ? " AND entry = " + quotedText(*options.entry) : "");
+    const auto step = std::chrono::duration_cast<std::chrono::microseconds>(options.every);
+    return replaced(replaced(kSeries, "STEP", std::to_string(step.count())), "VALUES", values);
 }
 
 std::string coverageQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
-    std::string grades;
-    for (const Grade grade :
-         {Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor, Grade::None}) {
-        const std::string name(nameOf(grade));
-        grades += ", round(100.0 * sum(CASE grade WHEN '" + name +
-                  "' THEN hold ELSE 0 END) / sum(hold), 1) AS " + name;
+    constexpr std::array kGrades{Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor};
+    std::string sums = "sum(hold)";
+    std::string shares;
+    for (std::size_t grade = 0; grade < kGrades.size(); ++grade) {
+        const std::string name(nameOf(kGrades.at(grade)));
+        // Those of this grade or a better one.
+        sums +=
+            formatText(", sum(CASE WHEN number * sign >= %@ * sign THEN hold ELSE 0 END)", {name});
+        const std::string better = grade == 0 ? "0" : "(summary ->> " + std::to_string(grade) + ")";
+        shares += formatText(", round(100.0 * ((summary ->> %llu) - %@) / (summary ->> 0), 1) "
+                             "AS %@",
+                             {std::uint64_t{grade + 1}, better, name});
     }
-    return levelTable(levels) +
-           formatText("SELECT device, system, level, %@ AS hours%@\n"
-                      "FROM (SELECT device, system, level, sum(hold) AS hold, "
-                      "quality(field, number, %@) AS grade\n"
-                      "FROM level JOIN measurement USING (field)\n"
-                      "WHERE number IS NOT NULL AND hold > 0%@\n"
-                      "GROUP BY device, system, level, field, number)\n"
-                      "GROUP BY device, system, level ORDER BY device, system, level",
-                      {kHours, grades, quotedText(options.profile), onlyDevice(options)});
+    return levelTables(levels) +
+           formatText("judged AS MATERIALIZED (SELECT d.device, l.level, "
+                      "(SELECT json_array(%@)\n%@) AS summary\n"
+                      "FROM (SELECT DISTINCT device FROM recordings r WHERE true%@) d "
+                      "CROSS JOIN level l)\n",
+                      {sums, levelValues(" AND r.device = d.device"), onlyDevice(options)}) +
+           formatText("SELECT device, level, %@%@, round(100.0 * ((summary ->> 0) - (summary ->> "
+                      "%llu)) / (summary ->> 0), 1) AS none\n"
+                      "FROM judged WHERE summary ->> 0 > 0 ORDER BY device, level",
+                      {kHours, shares, std::uint64_t{kGrades.size()}});
 }
 
 } // namespace
@@ -163,12 +237,18 @@ std::string quotedText(const std::string& text) {
 std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<double> below,
                                       const QualityProfile& profile) {
     std::vector<JudgedLevel> levels;
-    const auto add = [&](std::string_view field, std::string_view name) {
-        const bool isKnown = std::any_of(levels.begin(), levels.end(),
-                                         [&](const auto& level) { return level.field == field; });
+    const auto add = [&](std::string_view field, const std::string& name) {
         const auto measure = measureOf(field);
-        if (measure && !isKnown) {
-            levels.push_back(judged(field, name, *measure, below, profile));
+        if (!measure) {
+            return;
+        }
+        auto level = std::find_if(levels.begin(), levels.end(),
+                                  [&](const JudgedLevel& each) { return each.name == name; });
+        if (level == levels.end()) {
+            level = levels.insert(level, judged(name, *measure, below, profile));
+        }
+        if (std::find(level->fields.begin(), level->fields.end(), field) == level->fields.end()) {
+            level->fields.emplace_back(field);
         }
     };
     const auto asked = measureNamed(choice);
@@ -176,16 +256,13 @@ std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<d
         for (const StatusField& field : cell.fields) {
             const bool isWanted = choice.empty() || (asked && measureOf(field.field) == asked);
             if (field.role == StatusField::Role::Level && isWanted) {
-                add(field.field, field.name);
+                add(field.field, std::string(cell.name) + " " + std::string(field.name));
             }
         }
     }
-    if (choice.empty() || asked) {
-        return levels;
-    }
     for (const MeasuredField& each : measuredFields()) {
-        if (isEndOf(choice, each.name)) {
-            add(each.name, each.name);
+        if (!choice.empty() && !asked && isEndOf(choice, each.name)) {
+            add(each.name, std::string(each.name));
         }
     }
     return levels;
@@ -196,12 +273,12 @@ std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLeve
     case StoreAskOptions::Question::Devices:
         return "SELECT device, count(*) AS recordings, time_text(min(first) * 1000) AS first, "
                "time_text(max(last) * 1000) AS last, round(sum(last - first) / 3.6e6, 3) AS hours, "
-               "sum(packets) AS packets FROM recordings WHERE true" +
+               "sum(packets) AS packets FROM recordings r WHERE true" +
                onlyDevice(options) + " GROUP BY device ORDER BY device";
     case StoreAskOptions::Question::Recordings:
         return "SELECT device, name, technology, time_text(first * 1000) AS first, "
                "time_text(last * 1000) AS last, packets, every, identities, decoder, trouble "
-               "FROM recordings WHERE true" +
+               "FROM recordings r WHERE true" +
                onlyDevice(options) + " ORDER BY device, first, name";
     case StoreAskOptions::Question::Cells:
         return cellsQuery(options, levels);

@@ -10,12 +10,12 @@
 
 namespace pallax {
 
-/// A field that is judged as a level, and where it begins to be bad.
+/// A level of cells, which one or several fields tell.
 struct JudgedLevel {
-    std::string field;
-    std::string name;             ///< "RSRP"; of a field that no status shows, its own
-    std::optional<double> border; ///< nothing: no profile judges it
-    bool isSmallerBetter = false;
+    std::string name; ///< "LTE RSRP"; of a field that no status shows, its own
+    std::vector<std::string> fields;
+    Borders borders;              ///< of the profile; empty if it does not judge the level
+    std::optional<double> border; ///< where it begins to be bad; nothing: unknown
 };
 
 /// The levels that a question is about: those that the status shows of serving cells, those of one

@@ -126,30 +126,37 @@ TEST_F(EndToEndStore, AnswersQuestions) {
         EXPECT_EQ(asked.status, 0) << asked.err;
         return asked.out;
     };
-    EXPECT_EQ(ask({"cells", "--level", "rsrp", "--below", "-90"}),
-              "system,cell,level,devices,hours,border,below_percent,since,p5,p50,p95\n"
-              "lte,\"PCI 285, EARFCN 1850\",RSRP,1,0.003,-90,100,2023-11-14T22:14:46.036Z,-93.75,"
-              "-93.25,-90.75\n"
-              "lte,\"PCI 286, EARFCN 1850\",RSRP,1,0.001,-90,100,2023-11-14T22:15:16.036Z,-94.5,"
-              "-94.5,-90.5\n"
-              "lte,\"PCI 82, EARFCN 1850\",RSRP,1,0.005,-90,88.9,2023-11-14T22:14:58.036Z,-97.5,"
-              "-95.75,-86.75\n"
-              "lte,\"PCI 182, EARFCN 1850\",RSRP,1,0.004,-90,28.6,2023-11-14T22:13:32.036Z,-93.5,"
-              "-87,-80.75\n"
-              "lte,\"PCI 183, EARFCN 1850\",RSRP,1,0.019,-90,25.7,2023-11-14T22:13:40.036Z,-93,"
-              "-84.75,-78.75\n");
+    EXPECT_EQ(
+        ask({"cells", "--level", "rsrp", "--below", "-90"}),
+        "system,cell,level,devices,hours,border,below_percent,since,p5,p50,p95\n"
+        "lte,\"PCI 285, EARFCN 1850\",LTE RSRP,1,0.003,-90,100,2023-11-14T22:14:46.036Z,-93.75,"
+        "-93.25,-90.75\n"
+        "lte,\"PCI 286, EARFCN 1850\",LTE RSRP,1,0.001,-90,100,2023-11-14T22:15:16.036Z,-94.5,"
+        "-94.5,-90.5\n"
+        "lte,\"PCI 82, EARFCN 1850\",LTE RSRP,1,0.005,-90,88.9,2023-11-14T22:14:58.036Z,-97.5,"
+        "-95.75,-86.75\n"
+        "lte,\"PCI 182, EARFCN 1850\",LTE RSRP,1,0.004,-90,28.6,2023-11-14T22:13:32.036Z,-93.5,"
+        "-87,-80.75\n"
+        "lte,\"PCI 183, EARFCN 1850\",LTE RSRP,1,0.019,-90,25.7,2023-11-14T22:13:40.036Z,-93,"
+        "-84.75,-78.75\n");
     EXPECT_EQ(ask({"series", "serving_cell_measurements.measured_rsrp", "--every", "1m"}),
               "time,device,entry,least,mean,greatest,known_percent\n"
               "2023-11-14T22:13:00.000Z,car1,,-87,-83.19,-78.75,23.3\n"
               "2023-11-14T22:14:00.000Z,car1,,-94.5,-86.85,-77.5,43.4\n"
               "2023-11-14T22:15:00.000Z,car1,,-97.5,-93.97,-86.75,30\n");
     EXPECT_EQ(ask({"compare", "lte-drive.pcap", "2023-11-14", "--level", "rsrp"}),
-              "level,name,hours,below_percent,p5,p50,p95,change\n"
-              "RSRP,lte-drive.pcap,0.033,0,-96.25,-88.25,-79.75,\n"
-              "RSRP,2023-11-14,0.033,0,-96.25,-88.25,-79.75,0\n");
-    EXPECT_EQ(ask({"coverage"}), "device,system,level,hours,excellent,good,fair,poor,none\n"
-                                 "car1,lte,RSRP,0.033,100,0,0,0,0\n"
-                                 "car1,lte,RSRQ,0.033,98.3,1.7,0,0,0\n");
+              "what,name,hours,below_percent,p5,p50,p95,per_hour,change\n"
+              "LTE RSRP,lte-drive.pcap,0.033,0,-96.25,-88.25,-79.75,,\n"
+              "LTE RSRP,2023-11-14,0.033,0,-96.25,-88.25,-79.75,,0\n"
+              "cell-change,lte-drive.pcap,0.033,,,,,152.54,\n"
+              "cell-change,2023-11-14,0.033,,,,,152.54,0\n"
+              "context-down,lte-drive.pcap,0.033,,,,,91.53,\n"
+              "context-down,2023-11-14,0.033,,,,,91.53,0\n"
+              "context-up,lte-drive.pcap,0.033,,,,,122.03,\n"
+              "context-up,2023-11-14,0.033,,,,,122.03,0\n");
+    EXPECT_EQ(ask({"coverage"}), "device,level,hours,excellent,good,fair,poor,none\n"
+                                 "car1,LTE RSRP,0.033,100,0,0,0,0\n"
+                                 "car1,LTE RSRQ,0.033,98.3,1.7,0,0,0\n");
     EXPECT_EQ(ask({"recordings"}),
               "device,name,technology,first,last,packets,every,identities,decoder,trouble\n"
               "car1,lte-drive.pcap,lte,2023-11-14T22:13:20.036Z,2023-11-14T22:15:19.958Z,1200,tick,"
