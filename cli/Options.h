@@ -51,7 +51,7 @@ using ParsedOptions =
                  ServiceListOptions, SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions,
                  InfoOptions, SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
                  MaskOptions, VerifyOptions, ReportOptions, ModemListOptions, ModemPolicyOptions,
-                 WebOptions, StoreLoadOptions, StoreAskOptions, ParseEnd>;
+                 WebOptions, StoreLoadOptions, StoreWatchOptions, StoreAskOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -13,6 +13,7 @@ namespace {
 constexpr const char* kStoreFooter = R"(Examples:
   pallax store load --device car1 monday/*.pcapng
   pallax store load --into fleet.db --pseudonyms key recordings/*.pcapng.gz
+  pallax store watch --into fleet.db arriving
   pallax store query cells --below -110
   pallax store query series measured_rsrp --device car1 --every 1h
   pallax store query compare 2026-11-20 2026-11-21
@@ -36,6 +37,10 @@ keeps each value that was read, as the table "span" of pallax sql has it, in
 about 25 times the space. What identifies a person is left out, or replaced by
 pseudonyms (--pseudonyms; see pallax mask --help): with the same key, the same
 person is the same in all recordings.
+
+watch loads the recordings in FOLDER and in the folders in it, and then each one
+that appears there (.pcap and .pcapng, also .gz and .zst), when it is written or
+moved, until Ctrl-C.
 
 query answers one of these questions:
 
@@ -192,14 +197,17 @@ ParsedOptions askOptions(const StoreRequest& request) {
 } // namespace
 
 void addStore(CLI::App& app, StoreRequest& request) {
-    addChoice<StoreRequest::Action>(
-        app, "ACTION", request.action,
-        {{"load", StoreRequest::Action::Load}, {"query", StoreRequest::Action::Query}},
-        "What to do")
+    addChoice<StoreRequest::Action>(app, "ACTION", request.action,
+                                    {{"load", StoreRequest::Action::Load},
+                                     {"query", StoreRequest::Action::Query},
+                                     {"watch", StoreRequest::Action::Watch}},
+                                    "What to do")
         ->required();
-    app.add_option("WORDS", request.words,
-                   "The recordings to load (pcap or pcapng), or a question: devices, recordings, "
-                   "cells, series FIELD, compare A B, coverage or, with --sql, a query")
+    app.add_option(
+           "WORDS", request.words,
+           "The recordings to load (pcap or pcapng), or a question: devices, recordings, "
+           "cells, series FIELD, compare A B, coverage or, with --sql, a query; or the folder to "
+           "watch")
         ->type_name("");
     app.add_option("--into,--store", request.loading.store,
                    "The file of the store (default: measurements.db in the folder for data)")
@@ -215,11 +223,16 @@ ParsedOptions storeOptions(const StoreRequest& request) {
     if (request.action == StoreRequest::Action::Query) {
         return askOptions(request);
     }
-    if (request.words.empty()) {
+    if (request.action == StoreRequest::Action::Load && request.words.empty()) {
         return wrongUsage("load takes recordings", "store");
     }
     if (request.loading.device && request.loading.device->empty()) {
         return wrongUsage("a device has a name", "store");
+    }
+    if (request.action == StoreRequest::Action::Watch) {
+        return request.words.size() == 1
+                   ? ParsedOptions(StoreWatchOptions{request.loading, request.words.front()})
+                   : wrongUsage("watch takes one folder", "store");
     }
     return StoreLoadOptions{request.loading, request.words, request.jobs};
 }

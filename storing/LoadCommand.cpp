@@ -45,7 +45,7 @@ private:
             write(block);
         });
         const Loading::Seams seams{
-            [&output](const std::string& line) {
+            [&output](LoadOutcome::Kind /*kind*/, const std::string& line) {
                 appendPrintable(output.text(), line);
                 output.text() += '\n';
                 output.lineDone();

@@ -76,7 +76,7 @@ ExitStatus Loading::load(const std::string& path, const Seams& seams) {
         seams.complain(outcome.reason);
         return kExitFailure;
     }
-    seams.tell(textOf(outcome, path));
+    seams.tell(outcome.kind, textOf(outcome, path));
     if (outcome.trouble) {
         seams.complain(*outcome.trouble + " It was loaded up to there.");
         return kExitFailure;

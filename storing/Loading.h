@@ -26,7 +26,7 @@ public:
     explicit Loading(const LoadingOptions& options);
 
     struct Seams {
-        std::function<void(const std::string& line)> tell;
+        std::function<void(LoadOutcome::Kind kind, const std::string& line)> tell;
         std::function<void(const std::string& sentence)> complain;
         std::function<void(const Recording& recording, std::uint64_t packets)> progress;
     };

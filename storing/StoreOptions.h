@@ -27,6 +27,12 @@ struct StoreLoadOptions {
     std::optional<unsigned> jobs = {}; ///< nothing: one for each core
 };
 
+/// `pallax store watch`.
+struct StoreWatchOptions {
+    LoadingOptions loading = {};
+    std::string folder;
+};
+
 /// `pallax store query`.
 struct StoreAskOptions {
     enum class Question { Devices, Recordings, Cells, Series, Compare, Coverage, Sql };
@@ -47,6 +53,9 @@ struct StoreAskOptions {
 
 /// Asks a store and writes the rows to standard output. A wrong query is wrong usage.
 ExitStatus runStoreAsk(const StoreAskOptions& options);
+
+/// Loads the recordings in a folder, and then each one that appears, until a signal.
+ExitStatus runStoreWatch(const StoreWatchOptions& options);
 
 /// Loads the recordings and tells on standard output what became of each. Failure if one was
 /// refused, or is damaged.

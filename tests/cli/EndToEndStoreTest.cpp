@@ -163,6 +163,32 @@ TEST_F(EndToEndStore, AnswersQuestions) {
               "left out,0.1.0,\n");
 }
 
+TEST_F(EndToEndStore, WatchLoadsWhatAppears) {
+    const std::string arriving = world.path("arriving");
+    std::filesystem::create_directories(arriving + "/car1");
+    std::filesystem::copy_file(drive, arriving + "/car1/there.pcap");
+    PallaxProcess watching(world, {"store", "watch", "--into", world.path("s.db"), arriving});
+    ASSERT_TRUE(watching.says("loaded    " + arriving + "/car1/there.pcap: device car1"));
+    std::filesystem::copy_file(sample("umts-drive.pcap"), world.path("copy"));
+    std::filesystem::rename(world.path("copy"), arriving + "/car1/moved.pcap");
+    ASSERT_TRUE(watching.says("loaded    " + arriving + "/car1/moved.pcap: device car1"));
+    std::filesystem::create_directory(arriving + "/car2");
+    std::filesystem::copy_file(sample("cdma-drive.pcap"), arriving + "/car2/new.pcap");
+    ASSERT_TRUE(watching.says("loaded    " + arriving + "/car2/new.pcap: device car2"));
+    std::ofstream(arriving + "/notes.txt") << "no recording";
+    std::ofstream(arriving + "/broken.pcap") << "no recording";
+    ASSERT_TRUE(watching.says(arriving + "/broken.pcap"));
+    watching.signal(SIGTERM);
+    EXPECT_EQ(watching.wait(), 0);
+    EXPECT_EQ(watching.err().find("notes.txt"), std::string::npos) << watching.err();
+    PallaxProcess again(world, {"store", "watch", "--into", world.path("s.db"), arriving});
+    ASSERT_TRUE(again.says(arriving + "/broken.pcap"));
+    again.signal(SIGINT);
+    EXPECT_EQ(again.wait(), 0);
+    EXPECT_EQ(again.out(), "") << "all others are in the store";
+    EXPECT_EQ(run({"store", "watch", drive}).err, "pallax: " + drive + " is no folder.\n");
+}
+
 TEST_F(EndToEndStore, HostileNamesAreText) {
     const std::string file = world.path("it's.db");
     const std::string device = "'; DROP TABLE recordings;--\n\x1b[2J";

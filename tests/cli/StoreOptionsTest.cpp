@@ -57,6 +57,14 @@ TEST(StoreOptions, QueryTakesAQuestion) {
     EXPECT_EQ(sql.words, std::vector<std::string>{"select 1"});
 }
 
+TEST(StoreOptions, WatchTakesAFolder) {
+    const auto watch = parsed<StoreWatchOptions>({"store", "watch", "--into", "s.db", "arriving"});
+    EXPECT_EQ(watch.folder, "arriving");
+    EXPECT_EQ(watch.loading.store, "s.db");
+    EXPECT_EQ(refusal({"store", "watch"}),
+              "pallax: watch takes one folder (see pallax store --help)\n");
+}
+
 TEST(StoreOptions, WrongOnesAreToldInASentence) {
     EXPECT_EQ(refusal({"store", "load"}),
               "pallax: load takes recordings (see pallax store --help)\n");
