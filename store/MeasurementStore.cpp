@@ -4,13 +4,17 @@
 #include "query/TimelineTables.h"
 #include "store/NamedRows.h"
 
+#include <algorithm>
+#include <bit>
+
 namespace pallax {
 
 namespace {
 
 /// The columns as `recordingOf` takes them.
 std::string selectRecordings(const std::string& condition) {
-    return "SELECT id, device, name, digest, technology, decoder, every, identities, packets, "
+    return "SELECT id, device, name, digest, beginnings, technology, decoder, every, identities, "
+           "packets, "
            "first, last, trouble FROM recordings WHERE " +
            condition;
 }
@@ -20,8 +24,8 @@ LoadedRecording recordingOf(const Statement& row) {
     int column = 0;
     recording.id = row.integer(column++);
     for (std::string* text :
-         {&recording.device, &recording.name, &recording.digest, &recording.technology,
-          &recording.decoder, &recording.every, &recording.identities}) {
+         {&recording.device, &recording.name, &recording.digest, &recording.beginnings,
+          &recording.technology, &recording.decoder, &recording.every, &recording.identities}) {
         *text = row.text(column++);
     }
     for (std::int64_t* number : {&recording.packets, &recording.first, &recording.last}) {
@@ -43,6 +47,18 @@ std::string joined(const std::vector<std::string>& names) {
 
 } // namespace
 
+bool haveSameBeginning(const LoadedRecording& one, const LoadedRecording& other) {
+    const auto packets = static_cast<std::uint64_t>(std::min(one.packets, other.packets));
+    const std::string mark = " " + std::to_string(std::bit_floor(packets)) + ":";
+    const auto digestOf = [&mark](const LoadedRecording& recording) {
+        const std::size_t at = recording.beginnings.find(mark);
+        return at == std::string::npos
+                   ? std::string()
+                   : recording.beginnings.substr(at, recording.beginnings.find(' ', at + 1) - at);
+    };
+    return !digestOf(one).empty() && digestOf(one) == digestOf(other);
+}
+
 std::optional<LoadedRecording> MeasurementStore::withDigest(const std::string& digest) {
     Statement find = _connection->prepare(selectRecordings("digest = ?").c_str());
     return find.bind(1, digest).step() ? std::optional(recordingOf(find)) : std::nullopt;
@@ -61,12 +77,13 @@ std::vector<LoadedRecording> MeasurementStore::beginningAt(const std::string& te
 
 std::int64_t MeasurementStore::add(const LoadedRecording& recording) {
     Statement add = _connection->prepare(
-        "INSERT INTO recordings (device, name, digest, technology, decoder, every, identities, "
-        "packets, first, last, trouble) VALUES (?, ?, ?, ?, ?, ?, ?, ?, ?, ?, ?) RETURNING id");
+        "INSERT INTO recordings (device, name, digest, beginnings, technology, decoder, every, "
+        "identities, packets, first, last, trouble) VALUES (?, ?, ?, ?, ?, ?, ?, ?, ?, ?, ?, ?) "
+        "RETURNING id");
     int parameter = 1;
     for (const std::string* text :
-         {&recording.device, &recording.name, &recording.digest, &recording.technology,
-          &recording.decoder, &recording.every, &recording.identities}) {
+         {&recording.device, &recording.name, &recording.digest, &recording.beginnings,
+          &recording.technology, &recording.decoder, &recording.every, &recording.identities}) {
         add.bind(parameter++, *text);
     }
     for (const std::int64_t number : {recording.packets, recording.first, recording.last}) {

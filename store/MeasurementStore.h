@@ -19,6 +19,7 @@ struct LoadedRecording {
     std::string device;
     std::string name; ///< of the file
     std::string digest;
+    std::string beginnings; ///< digests of its first 1, 2, 4, 8, ... packets, as the table has them
     std::string technology; ///< the name on the command line
     std::string decoder;    ///< the version that has read it
     std::string every;      ///< tick or packet
@@ -28,6 +29,10 @@ struct LoadedRecording {
     std::int64_t last = 0;
     std::optional<std::string> trouble; ///< why its end is missing
 };
+
+/// Whether one recording is a first part of the other, such as a damaged copy, as far as the
+/// digests of their beginnings tell.
+bool haveSameBeginning(const LoadedRecording& one, const LoadedRecording& other);
 
 /// The recordings of a store. All functions may throw StoreFailure.
 class MeasurementStore {

@@ -8,6 +8,7 @@
 #include "store/NamedRows.h"
 #include "text/Format.h"
 
+#include <bit>
 #include <charconv>
 #include <filesystem>
 #include <utility>
@@ -28,11 +29,17 @@ public:
         const auto since = packet.time.time_since_epoch().count();
         _digest.add(std::to_string(since) + " " + std::to_string(packet.data.size()) + ":");
         _digest.add(packet.data);
+        if (std::has_single_bit(++_packets)) {
+            _beginnings += " " + std::to_string(_packets) + ":" + _digest.soFar();
+        }
     }
     std::string soFar() const { return _digest.soFar(); }
+    const std::string& beginnings() const { return _beginnings; }
 
 private:
     Sha256 _digest;
+    std::uint64_t _packets = 0;
+    std::string _beginnings;
 };
 
 /// "0.10.2" is later than "0.9".
@@ -63,6 +70,11 @@ std::string folderName(const std::string& path) {
     return name.empty() ? "/" : name;
 }
 
+/// Another program has loaded more of it in the meantime.
+struct AlreadyThere {
+    std::string reason;
+};
+
 class Load {
 public:
     Load(const std::string& path, const LoadRequest& request, const StoreDecoder& decoder,
@@ -74,7 +86,7 @@ public:
 private:
     std::optional<std::string> examine();
     std::optional<std::string> reasonToSkip();
-    void findShorter(const PacketDigest& digest);
+    std::optional<std::string> longerOne();
     std::optional<std::string> decode();
     void begin();
     void write();
@@ -91,9 +103,6 @@ private:
     const RecordedTechnology* _technology = nullptr;
     Time _first;
     LoadedRecording _recording;
-    std::vector<LoadedRecording> _earlier; ///< that may be a first part of this one
-    std::optional<LoadedRecording> _shorter;
-
     std::optional<RecordingMeasurements> _measurements;
     std::optional<IntervalWriter> _intervals;
     std::optional<StoreConnection::Transaction> _transaction;
@@ -108,8 +117,12 @@ LoadOutcome Load::run() {
     if (auto reason = reasonToSkip()) {
         return {LoadOutcome::Kind::Skipped, _recording.device, std::move(*reason)};
     }
-    if (auto refusal = decode()) {
-        return {LoadOutcome::Kind::Refused, {}, std::move(*refusal)};
+    try {
+        if (auto refusal = decode()) {
+            return {LoadOutcome::Kind::Refused, {}, std::move(*refusal)};
+        }
+    } catch (AlreadyThere& there) {
+        return {LoadOutcome::Kind::Skipped, _recording.device, std::move(there.reason)};
     }
     return {_replaces ? LoadOutcome::Kind::Replaced : LoadOutcome::Kind::Loaded,
             _recording.device,
@@ -149,9 +162,7 @@ std::optional<std::string> Load::examine() {
             _first = packet->time;
             _recording.first = millisecondsOf(packet->time);
             _recording.last = _recording.first;
-            _earlier = _store.beginningAt(_recording.technology, _recording.first);
         }
-        findShorter(digest);
         digest.add(*packet);
         ++_recording.packets;
         _recording.last = std::max(_recording.last, millisecondsOf(packet->time));
@@ -163,23 +174,25 @@ std::optional<std::string> Load::examine() {
         return _recording.trouble.value_or(formatText("%@ has no packets.", {recording.name()}));
     }
     _recording.digest = digest.soFar();
+    _recording.beginnings = digest.beginnings();
     return std::nullopt;
 }
 
-/// Whether the packets so far are those of a recording in the store: it was loaded while it grew,
-/// or from a damaged copy.
-void Load::findShorter(const PacketDigest& digest) {
-    for (const LoadedRecording& earlier : _earlier) {
-        if (earlier.packets == _recording.packets && earlier.digest == digest.soFar()) {
-            _shorter = earlier;
+/// Why not to load a recording of which the store has more packets; nothing if it has not.
+std::optional<std::string> Load::longerOne() {
+    for (const auto& other : _store.beginningAt(_recording.technology, _recording.first)) {
+        if (other.packets > _recording.packets && haveSameBeginning(_recording, other)) {
+            return formatText("the store has it with more packets (%lld), as %@",
+                              {other.packets, other.name});
         }
     }
+    return std::nullopt;
 }
 
 std::optional<std::string> Load::reasonToSkip() {
     const auto known = _store.withDigest(_recording.digest);
     if (!known) {
-        return std::nullopt;
+        return longerOne();
     }
     if (_request.device && known->device != *_request.device) {
         _recording.device = known->device;
@@ -247,10 +260,16 @@ void Load::begin() {
     }
     _transaction.emplace(_store.connection());
     // Others may have loaded it meanwhile.
-    for (const auto& before : {_store.withDigest(_recording.digest), _shorter}) {
-        if (before) {
-            _recording.device = before->device;
-            _store.remove(before->id);
+    if (auto reason = longerOne()) {
+        throw AlreadyThere{std::move(*reason)};
+    }
+    for (const auto& before : _store.beginningAt(_recording.technology, _recording.first)) {
+        // It was loaded while it grew, or from a damaged copy.
+        const bool isShorter =
+            before.packets < _recording.packets && haveSameBeginning(_recording, before);
+        if (isShorter || before.digest == _recording.digest) {
+            _recording.device = before.device;
+            _store.remove(before.id);
             _replaces = true;
         }
     }

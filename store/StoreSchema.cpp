@@ -11,6 +11,7 @@ CREATE TABLE recordings (
     device TEXT NOT NULL,
     name TEXT NOT NULL,       -- of the file, without its folder
     digest TEXT NOT NULL UNIQUE, -- SHA-256 of the packets with their times
+    beginnings TEXT NOT NULL, -- digests of its first 1, 2, 4, 8, ... packets: " 4:0f3a..."
     technology TEXT NOT NULL,
     decoder TEXT NOT NULL,    -- the version that read it: a newer one replaces all of its rows
     every TEXT NOT NULL,      -- tick: values at display ticks; packet: every value that was read

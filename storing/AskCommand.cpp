@@ -78,9 +78,15 @@ private:
     }
     std::optional<std::string> findField(const std::string& name) {
         const std::string end = quotedText("." + name);
-        const auto found =
-            textsOf(_database, "SELECT name FROM field WHERE name = " + quotedText(name) +
-                                   " OR substr(name, -length(" + end + ")) = " + end);
+        const auto named = [&](const std::string& condition) {
+            return textsOf(_database, "SELECT name FROM field WHERE (name = " + quotedText(name) +
+                                          " OR substr(name, -length(" + end + ")) = " + end + ")" +
+                                          condition);
+        };
+        auto found = named(" AND NOT in_list"); // is meant before those in lists
+        if (found.size() != 1) {
+            found = named("");
+        }
         if (found.size() == 1) {
             _levels.push_back({found.front(), {found.front()}, {}, {}});
             return std::nullopt;

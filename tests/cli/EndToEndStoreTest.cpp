@@ -139,7 +139,7 @@ TEST_F(EndToEndStore, AnswersQuestions) {
         "-87,-80.75\n"
         "lte,\"PCI 183, EARFCN 1850\",LTE RSRP,1,0.019,-90,25.7,2023-11-14T22:13:40.036Z,-93,"
         "-84.75,-78.75\n");
-    EXPECT_EQ(ask({"series", "serving_cell_measurements.measured_rsrp", "--every", "1m"}),
+    EXPECT_EQ(ask({"series", "measured_rsrp", "--every", "1m"}),
               "time,device,entry,least,mean,greatest,known_percent\n"
               "2023-11-14T22:13:00.000Z,car1,,-87,-83.19,-78.75,23.3\n"
               "2023-11-14T22:14:00.000Z,car1,,-94.5,-86.85,-77.5,43.4\n"

@@ -82,6 +82,14 @@ TEST_F(RecordingLoadTest, OneThatHasGrownReplacesItsFirstPart) {
               std::vector<std::string>{std::to_string(journal.size())});
 }
 
+TEST_F(RecordingLoadTest, AFirstPartOfOneThatIsThereIsSkipped) {
+    (void)load(write("drive.pcap"));
+    const LoadOutcome part = load(write("part.pcap", 1000));
+    EXPECT_EQ(part.kind, Kind::Skipped);
+    EXPECT_EQ(part.reason, "the store has it with more packets (2400), as drive.pcap");
+    EXPECT_EQ(ask("SELECT count(*) FROM recordings"), std::vector<std::string>{"1"});
+}
+
 TEST_F(RecordingLoadTest, RecordingsThatBeginAlikeAreNotConfused) {
     (void)load(write("drive.pcap", 1000));
     MemoryJournal other;
