@@ -59,7 +59,13 @@ private:
                     _progress.packetDone(recording, source, packets);
                 }
             }};
-        const ExitStatus status = _loading.load(_options.recordings[recording], seams);
+        const std::string& path = _options.recordings[recording];
+        ExitStatus status = kExitFailure;
+        try {
+            status = _loading.load(path, seams);
+        } catch (const StoreFailure& failure) { // the next one may fit
+            seams.complain(formatText("%@ was not loaded: %@", {path, failure.what()}));
+        }
         if (_progress.isShown()) {
             _progress.recordingDone(recording);
         }
@@ -79,7 +85,7 @@ private:
         const auto error =
             workers.run([&](std::size_t recording, const auto& outcome, const WorkerFiles& files) {
                 status = std::max(status, collect(recording, outcome, files));
-                return !outcome.gaveUp;
+                return true;
             });
         if (error) {
             _progress.wipe();
