@@ -137,11 +137,13 @@ void MeasurementStore::addCells(std::int64_t recording, const std::vector<FoundC
 }
 
 void MeasurementStore::remove(std::int64_t recording) {
+    constexpr const char* kIntervals =
+        "DELETE FROM intervals WHERE id BETWEEN (SELECT min(first_row) FROM series WHERE recording "
+        "= ?1) AND (SELECT max(last_row) FROM series WHERE recording = ?1)";
     for (const char* sql :
-         {"DELETE FROM intervals WHERE id BETWEEN (SELECT min(first_row) FROM series WHERE "
-          "recording = ?1) AND (SELECT max(last_row) FROM series WHERE recording = ?1)",
-          "DELETE FROM series WHERE recording = ?1", "DELETE FROM events WHERE recording = ?1",
-          "DELETE FROM cells WHERE recording = ?1", "DELETE FROM recordings WHERE id = ?1"}) {
+         {kIntervals, "DELETE FROM series WHERE recording = ?1",
+          "DELETE FROM events WHERE recording = ?1", "DELETE FROM cells WHERE recording = ?1",
+          "DELETE FROM recordings WHERE id = ?1"}) {
         _connection->prepare(sql).bind(1, recording).run();
     }
 }

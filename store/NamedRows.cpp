@@ -2,6 +2,7 @@
 
 #include "fields/Standing.h"
 #include "query/CellFinder.h"
+#include "store/NumberText.h"
 #include "text/NumberFormat.h"
 
 #include <cmath>
@@ -16,9 +17,8 @@ constexpr const char* kAddField =
     "UPDATE SET path = ?2, kind = ?3, unit = ?4, least = ?5, most = ?6, in_list = ?7, "
     "identifies = ?8, personal = ?9, meaning = ?10, shown = ?11 RETURNING id";
 
-template <class Value>
-std::string bytesOf(const Value& value) {
-    return {static_cast<const char*>(static_cast<const void*>(&value)), sizeof value};
+std::string bytesOf(double number) {
+    return {static_cast<const char*>(static_cast<const void*>(&number)), sizeof number};
 }
 
 } // namespace
@@ -83,7 +83,11 @@ std::optional<std::int64_t> NamedRows::text(const FieldInfo& info, const FieldVa
     std::string key = info.name + '\n' + format + '\n' + std::to_string(value.raw.value_or(-1)) +
                       (value.raw ? "r" : "") + (value.shown.displayNumber() != nullptr ? "n" : "t");
     const DisplayNumber* shown = value.shown.displayNumber();
-    key += shown != nullptr ? bytesOf(&shown->format()) + bytesOf(value.number) : value.text();
+    key += shown != nullptr ? printfText(shown->format()) + bytesOf(value.number) : value.text();
+    constexpr std::size_t kMostKept = std::size_t{1} << 18U; // the others are asked for again
+    if (_texts.size() >= kMostKept) {
+        _texts.clear();
+    }
     const auto [place, isNew] = _texts.try_emplace(std::move(key));
     if (isNew) {
         const std::string text = value.text();

@@ -70,6 +70,8 @@ std::string folderName(const std::string& path) {
     return name.empty() ? "/" : name;
 }
 
+constexpr std::size_t kMostEvents = 65536; ///< that wait to be written
+
 /// Another program has loaded more of it in the meantime.
 struct AlreadyThere {
     std::string reason;
@@ -235,7 +237,7 @@ std::optional<std::string> Load::decode() {
             masked.assign(packet->data.begin(), packet->data.end());
             mask(masked);
             isReadable = _measurements->add({number, packet->time, masked});
-            if (_intervals->isFull()) {
+            if (_intervals->isFull() || _measurements->eventCount() > kMostEvents) {
                 write();
             }
         }

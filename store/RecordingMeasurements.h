@@ -69,6 +69,7 @@ public:
 
     const FieldTable& fields() const { return _fields; }
     const EntryTable& entries() const { return _entries; }
+    std::size_t eventCount() const { return _events.size(); }
     /// Those that have happened since the last call.
     std::vector<Event> takeEvents() { return std::exchange(_events, {}); }
     const std::vector<FoundCell>& cells() const { return _cells.soFar(); }

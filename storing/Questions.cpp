@@ -121,7 +121,7 @@ std::string cellsQuery(const StoreAskOptions& options, const std::vector<JudgedL
 /// Whether a row is of a device, a recording or a day with this name.
 std::string isOf(const std::string& word, const std::string& milliseconds) {
     const std::string name = quotedText(word);
-    const std::string names = name + " IN (r.device, r.name)";
+    std::string names = name + " IN (r.device, r.name)";
     if (!parseIsoDate(word + "T00:00:00Z")) {
         return names;
     }
