@@ -80,15 +80,35 @@ TEST(RecordingMeasurements, ALevelThatIsOldIsNotKnown) {
         fixture.journal.add(last.time + std::chrono::seconds(second), other);
     }
     Time latest{};
-    const auto rsrp = *FieldTable(fixture.technology, fixture.resources)
-                           .named("lte.serving_cell_measurements.measured_rsrp");
+    const FieldTable fields(fixture.technology, fixture.resources);
     for (const Interval& interval : intervalsOf(fixture, Resolution::Tick)) {
-        if (interval.field == rsrp) {
+        if (fields[interval.field].name.ends_with("_rsrp")) {
             latest = std::max(latest, interval.start + interval.hold);
         }
     }
     EXPECT_GT(latest, Simulation::kStart);
     EXPECT_LE(latest, last.time + RecordingMeasurements::kLevelHolds + std::chrono::seconds(2));
+}
+
+TEST(RecordingMeasurements, OfLevelsThatTellTheSameTheLatestIsKnown) {
+    TimelineFixture fixture("lte");
+    fixture.drive(1, std::chrono::seconds(200));
+    const FieldTable fields(fixture.technology, fixture.resources);
+    const auto idle = *fields.named("lte.serving_cell_measurements.measured_rsrp");
+    const auto connected =
+        *fields.named("lte.connected_mode_lte_intra_frequency_measurement.serving_filtered_rsrp");
+    std::vector<Interval> levels = intervalsOf(fixture, Resolution::Tick);
+    std::erase_if(levels, [&](const Interval& each) {
+        return each.field != idle && each.field != connected;
+    });
+    std::sort(levels.begin(), levels.end(),
+              [](const Interval& one, const Interval& other) { return one.start < other.start; });
+    bool areBoth = false;
+    for (std::size_t index = 1; index < levels.size(); ++index) {
+        EXPECT_GE(levels[index].start, levels[index - 1].start + levels[index - 1].hold);
+        areBoth = areBoth || levels[index].field != levels[index - 1].field;
+    }
+    EXPECT_TRUE(areBoth);
 }
 
 TEST(RecordingMeasurements, NothingHoldsAcrossAGap) {
