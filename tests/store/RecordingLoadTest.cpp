@@ -3,6 +3,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <random>
 
 namespace pallax {
 namespace {
@@ -146,6 +147,33 @@ TEST_F(RecordingLoadTest, AFullDiskLeavesTheStoreAsItWas) {
     EXPECT_THROW((void)loadRecording(path, request(), {resources, bundle, technologies()}, store),
                  StoreFailure);
     EXPECT_EQ(content(), before);
+}
+
+TEST_F(RecordingLoadTest, ADamagedStoreIsNoMoreThanASentence) {
+    (void)load(write("drive.pcap", 500));
+    const std::string whole = doubles::contentOf(file);
+    const std::string other = write("other.pcap");
+    std::mt19937 random(1); // NOLINT(*-msc51-cpp): the same bytes each time
+    int told = 0;
+    for (int time = 0; time < 100; ++time) {
+        std::string damaged = whole;
+        for (int byte = 0; byte < 20; ++byte) {
+            damaged[random() % damaged.size()] = static_cast<char>(random());
+        }
+        std::ofstream(file, std::ios::binary) << damaged;
+        if (StoreConnection::refusal(file)) {
+            ++told;
+            continue;
+        }
+        (void)ask("SELECT count(text), sum(hold) FROM measurement");
+        try {
+            (void)load(other);
+        } catch (const StoreFailure& failure) {
+            EXPECT_TRUE(std::string(failure.what()).starts_with(file)) << failure.what();
+            ++told;
+        }
+    }
+    EXPECT_GT(told, 0);
 }
 
 class PersonalRecordingLoadTest : public StoreFixture {
