@@ -163,6 +163,36 @@ TEST_F(EndToEndStore, AnswersQuestions) {
               "left out,0.1.0,\n");
 }
 
+TEST_F(EndToEndStore, QueriesOfRecordingsRunUnchanged) {
+    const std::string recording = world.path("umts.pcap");
+    ASSERT_EQ(run({"simulate", "utran", "--seconds", "200", "-o", recording}).status, 0);
+    ASSERT_EQ(
+        run({"store", "load", "--every", "packet", "--into", world.path("s.db"), recording}).status,
+        0);
+    // Those of pallax-sql(7) on these tables.
+    for (const char* query :
+         {"select time_text(time) as time, words from event where kind = 'cell-change' limit 4",
+          "select kind, count(*) as times from event group by kind",
+          "with lost as (select time from event where words like 'RRC Cell DCH%' limit 1), course "
+          "as (select *, lag(text) over (partition by field, entry order by start) as before from "
+          "span) select (start - time) / 1000000 as after, field, before, text from course, lost "
+          "where start between time - 2000000 and time + 2000000 and before <> text and field not "
+          "in ('utran.cctrch_sir.sir', 'utran.trch_bler.trch_bler_measurement') and field not "
+          "like '%neighbor%' order by start",
+          "select role, identity, readings, best_level, substr(time_text(first_time), 12, 8) as "
+          "first, substr(time_text(last_time), 12, 8) as last from cell where role = 'serving'",
+          "select time_text(start) as since, round(hold / 1e6, 1) as seconds from span where field "
+          "= 'utran.rrc_info.state' and text = 'Cell DCH' limit 4"}) {
+        const Run there = run({"sql", "--format", "csv", recording, query});
+        EXPECT_EQ(there.status, 0) << there.err;
+        EXPECT_EQ(run({"store", "query", "--store", world.path("s.db"), "--format", "csv", "--sql",
+                       query})
+                      .out,
+                  there.out);
+        EXPECT_GT(std::count(there.out.begin(), there.out.end(), '\n'), 1) << query;
+    }
+}
+
 TEST_F(EndToEndStore, WatchLoadsWhatAppears) {
     const std::string arriving = world.path("arriving");
     std::filesystem::create_directories(arriving + "/car1");
