@@ -42,13 +42,6 @@ std::string fileName(const std::string& file) {
     return file.starts_with('/') ? file : "./" + file;
 }
 
-/// SQLite asks it while another program writes, for as long as that takes.
-int waitForWriter(void* /*nothing*/, int /*times*/) {
-    constexpr std::chrono::milliseconds kPause{5};
-    std::this_thread::sleep_for(kPause);
-    return 1;
-}
-
 /// What the tables of a file are, without those of SQLite itself.
 std::string tablesOf(sqlite3* connection, const std::string& file) {
     constexpr const char* kTables = "SELECT group_concat(type || ' ' || name || ' ' || sql, ';') "
@@ -153,7 +146,7 @@ StoreConnection::StoreConnection(std::string file, Mode mode) : _file(std::move(
     if (code != SQLITE_OK) {
         throw StoreFailure(sentenceOf(_file, connection, code));
     }
-    sqlite3_busy_handler(connection, waitForWriter, nullptr);
+    sqlite3_busy_handler(connection, waitForWriter, this);
     // The file may be anybody's.
     sqlite3_db_config(connection, SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
     sqlite3_db_config(connection, SQLITE_DBCONFIG_TRUSTED_SCHEMA, 0, nullptr);
@@ -169,6 +162,18 @@ StoreConnection::StoreConnection(const std::string& file) : StoreConnection(file
         makeTables();
     }
     check(Empty::Refused);
+}
+
+/// SQLite asks it while another program writes, for as long as that takes.
+int StoreConnection::waitForWriter(void* connection, int times) {
+    constexpr std::chrono::milliseconds kPause{5};
+    constexpr std::chrono::milliseconds kPatience{500};
+    const auto& waiting = static_cast<StoreConnection*>(connection)->_waiting;
+    if (waiting && times == kPatience / kPause) {
+        waiting();
+    }
+    std::this_thread::sleep_for(kPause);
+    return 1;
 }
 
 std::unique_ptr<StoreConnection> StoreConnection::open(const std::string& file) {

@@ -1,11 +1,13 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <optional>
 #include <stdexcept>
 #include <string>
 #include <string_view>
+#include <utility>
 
 struct sqlite3;
 struct sqlite3_stmt;
@@ -70,6 +72,8 @@ public:
     Statement prepare(const char* sql);
     void run(const char* sql);
     const std::string& file() const { return _file; }
+    /// Called once for each wait of more than half a second for another program that writes.
+    void setWaiting(std::function<void()> waiting) { _waiting = std::move(waiting); }
 
     /// Waits for other writers. Ends without `commit` as if nothing had been written.
     class Transaction {
@@ -98,10 +102,12 @@ private:
     /// Throws unless it is a store of this version.
     void check(Empty empty);
     void makeTables();
+    static int waitForWriter(void* connection, int times);
     bool isEmpty();
     std::int64_t number(const char* sql);
 
     std::string _file;
+    std::function<void()> _waiting;
     std::unique_ptr<sqlite3, Close> _connection;
 };
 

@@ -58,7 +58,8 @@ private:
                 if (_progress.isShown()) {
                     _progress.packetDone(recording, source, packets);
                 }
-            }};
+            },
+            !_isAtOnce};
         const std::string& path = _options.recordings[recording];
         ExitStatus status = kExitFailure;
         try {
@@ -74,6 +75,7 @@ private:
     }
 
     ExitStatus loadAtOnce(unsigned jobs) {
+        _isAtOnce = true;
         OrderedWorkers workers(
             _options.recordings.size(), jobs,
             [this](std::size_t recording, const WorkerFiles& /*files*/) {
@@ -113,6 +115,7 @@ private:
     Loading _loading;
     MonotonicClock _clock;
     DecodeProgress _progress;
+    bool _isAtOnce = false; ///< several processes write, one after the other
 };
 
 } // namespace

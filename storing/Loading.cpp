@@ -70,6 +70,12 @@ Loading::Loading(const LoadingOptions& options)
 
 ExitStatus Loading::load(const std::string& path, const Seams& seams) {
     MeasurementStore store(_file);
+    if (seams.isAlone) {
+        store.connection().setWaiting([&] {
+            seams.complain(
+                formatText("%@: another program writes to %@; waiting for it.", {path, _file}));
+        });
+    }
     const LoadOutcome outcome =
         loadRecording(path, requestOf(seams), {_resources, _bundle, technologies()}, store);
     if (outcome.kind == LoadOutcome::Kind::Refused) {

@@ -29,6 +29,8 @@ public:
         std::function<void(LoadOutcome::Kind kind, const std::string& line)> tell;
         std::function<void(const std::string& sentence)> complain;
         std::function<void(const Recording& recording, std::uint64_t packets)> progress;
+        /// Whether a writer that is waited for is another program, of which to tell.
+        bool isAlone = true;
     };
     /// Loads one recording and tells what became of it. Failure if it was refused or is damaged.
     ExitStatus load(const std::string& path, const Seams& seams);

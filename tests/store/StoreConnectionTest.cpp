@@ -110,6 +110,19 @@ TEST_F(StoreConnectionTest, ATransactionThatIsNotCommittedHasNoEffect) {
     EXPECT_FALSE(texts.step());
 }
 
+TEST_F(StoreConnectionTest, AWaitForAnotherWriterIsTold) {
+    const auto writer = StoreConnection::open(file);
+    const auto store = StoreConnection::open(file);
+    writer->run("BEGIN IMMEDIATE");
+    int told = 0;
+    store->setWaiting([&] {
+        ++told;
+        writer->run("COMMIT");
+    });
+    StoreConnection::Transaction transaction(*store);
+    EXPECT_EQ(told, 1);
+}
+
 TEST_F(StoreConnectionTest, AFullDiskIsASentence) {
     const auto store = StoreConnection::open(file);
     store->run("PRAGMA max_page_count = 40");
