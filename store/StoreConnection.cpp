@@ -42,6 +42,21 @@ std::string fileName(const std::string& file) {
     return file.starts_with('/') ? file : "./" + file;
 }
 
+/// Another program makes or tidies up the file, for which SQLite does not wait.
+class StoreBusy : public StoreFailure {
+public:
+    using StoreFailure::StoreFailure;
+};
+
+[[noreturn]] void fail(const std::string& file, sqlite3* connection, int code) {
+    constexpr int kPrimary = 0xFF;
+    const std::string sentence = sentenceOf(file, connection, code);
+    if ((code & kPrimary) == SQLITE_BUSY) {
+        throw StoreBusy(sentence);
+    }
+    throw StoreFailure(sentence);
+}
+
 /// What the tables of a file are, without those of SQLite itself.
 std::string tablesOf(sqlite3* connection, const std::string& file) {
     constexpr const char* kTables = "SELECT group_concat(type || ' ' || name || ' ' || sql, ';') "
@@ -54,7 +69,7 @@ std::string tablesOf(sqlite3* connection, const std::string& file) {
     };
     const int code = sqlite3_exec(connection, kTables, take, &tables, nullptr);
     if (code != SQLITE_OK) {
-        throw StoreFailure(sentenceOf(file, connection, code));
+        fail(file, connection, code);
     }
     return tables;
 }
@@ -66,6 +81,21 @@ std::string tablesOfStore() {
     const std::unique_ptr<sqlite3, int (*)(sqlite3*)> closing(memory, sqlite3_close_v2);
     (void)sqlite3_exec(memory, storeSchema(), nullptr, nullptr, nullptr);
     return tablesOf(memory, "memory");
+}
+
+/// Opens it again while it is busy, for some seconds.
+template <class Open>
+auto whenFree(const Open& open) {
+    constexpr std::chrono::milliseconds kPause{5};
+    constexpr int kMostPauses = 2000;
+    for (int pause = 0; pause < kMostPauses; ++pause) {
+        try {
+            return open();
+        } catch (const StoreBusy&) {
+            std::this_thread::sleep_for(kPause);
+        }
+    }
+    return open();
 }
 
 } // namespace
@@ -105,9 +135,9 @@ bool Statement::step() {
         return true;
     }
     if (code != SQLITE_DONE) {
-        std::string sentence = sentenceOf(_file, sqlite3_db_handle(_statement.get()), code);
-        sqlite3_reset(_statement.get());
-        throw StoreFailure(sentence);
+        sqlite3* connection = sqlite3_db_handle(_statement.get());
+        sqlite3_reset(_statement.get()); // the connection keeps the error
+        fail(_file, connection, code);
     }
     sqlite3_reset(_statement.get());
     return false;
@@ -144,7 +174,7 @@ StoreConnection::StoreConnection(std::string file, Mode mode) : _file(std::move(
         sqlite3_open_v2(fileName(_file).c_str(), &connection, flags | SQLITE_OPEN_NOMUTEX, nullptr);
     _connection.reset(connection);
     if (code != SQLITE_OK) {
-        throw StoreFailure(sentenceOf(_file, connection, code));
+        fail(_file, connection, code);
     }
     sqlite3_busy_handler(connection, waitForWriter, this);
     // The file may be anybody's.
@@ -184,7 +214,7 @@ std::unique_ptr<StoreConnection> StoreConnection::open(const std::string& file) 
     if (!created && errno != EEXIST) {
         throw StoreFailure(formatText("%@ cannot be created: %@.", {file, std::strerror(errno)}));
     }
-    return std::unique_ptr<StoreConnection>(new StoreConnection(file));
+    return whenFree([&] { return std::unique_ptr<StoreConnection>(new StoreConnection(file)); });
 }
 
 std::optional<std::string> StoreConnection::refusal(const std::string& file) {
@@ -193,7 +223,7 @@ std::optional<std::string> StoreConnection::refusal(const std::string& file) {
         return formatText("There is no store %@ (see pallax store load).", {file});
     }
     try {
-        StoreConnection(file, Mode::Read).check(Empty::Refused);
+        whenFree([&] { StoreConnection(file, Mode::Read).check(Empty::Refused); });
     } catch (const StoreFailure& failure) {
         return failure.what();
     }
@@ -244,7 +274,7 @@ Statement StoreConnection::prepare(const char* sql) {
     const int code = sqlite3_prepare_v3(_connection.get(), sql, -1, SQLITE_PREPARE_PERSISTENT,
                                         &statement, nullptr);
     if (code != SQLITE_OK) {
-        throw StoreFailure(sentenceOf(_file, _connection.get(), code));
+        fail(_file, _connection.get(), code);
     }
     return {statement, _file};
 }
@@ -252,7 +282,7 @@ Statement StoreConnection::prepare(const char* sql) {
 void StoreConnection::run(const char* sql) {
     const int code = sqlite3_exec(_connection.get(), sql, nullptr, nullptr, nullptr);
     if (code != SQLITE_OK) {
-        throw StoreFailure(sentenceOf(_file, _connection.get(), code));
+        fail(_file, _connection.get(), code);
     }
 }
 
