@@ -34,7 +34,7 @@ The device of a recording is the name of its folder, unless --device names it.
 Values are those that the display shows at its ticks, every two seconds, and a
 level that was read more than 10 s ago is not known any more; --every packet
 keeps each value that was read, as the table "span" of pallax sql has it, in
-about 25 times the space. What identifies a person is left out, or replaced by
+more than ten times the space. What identifies a person is left out, or replaced by
 pseudonyms (--pseudonyms; see pallax mask --help): with the same key, the same
 person is the same in all recordings.
 
