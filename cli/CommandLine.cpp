@@ -112,6 +112,7 @@ CommandLine::CommandLine()
     addWeb(addCommand("web", "Serve a live page to browsers of this machine"), _web);
     addMask(addCommand("mask", "Copy files without what identifies a person"), _mask);
     addVerify(addCommand("verify", "Tell whether recordings are what they were"), _verify);
+    addStore(addCommand("store", "Keep the measurements of many recordings"), _store);
     addTexts();
 }
 
@@ -270,6 +271,9 @@ ParsedOptions CommandLine::chosen() const {
     }
     if (_app->got_subcommand("snapshot")) {
         return _snapshot;
+    }
+    if (_app->got_subcommand("store")) {
+        return storeOptions(_store);
     }
     if (_app->got_subcommand("watch")) {
         return _watch;

@@ -4,6 +4,7 @@
 #include "cli/ModemOptions.h"
 #include "cli/Options.h"
 #include "cli/ServiceRequest.h"
+#include "cli/StoreRequest.h"
 
 #include <memory>
 #include <string>
@@ -50,6 +51,7 @@ private:
     VerifyOptions _verify;
     ReportOptions _report;
     WebOptions _web;
+    StoreRequest _store;
     SnapshotOptions _snapshot;
     RecordOptions _record;
     ServiceRequest _service;

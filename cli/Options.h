@@ -16,6 +16,7 @@
 #include "recording/RecordOptions.h"
 #include "recording/Simulate.h"
 #include "reporting/ReportCommand.h"
+#include "storing/StoreOptions.h"
 #include "telephony/Service.h"
 #include "verifying/VerifyCommand.h"
 #include "watching/WatchCommand.h"
@@ -50,7 +51,7 @@ using ParsedOptions =
                  ServiceListOptions, SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions,
                  InfoOptions, SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
                  MaskOptions, VerifyOptions, ReportOptions, ModemListOptions, ModemPolicyOptions,
-                 WebOptions, ParseEnd>;
+                 WebOptions, StoreLoadOptions, StoreWatchOptions, StoreAskOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -52,6 +52,9 @@ struct Run {
     ExitStatus operator()(const VerifyOptions& options) const { return runVerify(options); }
     ExitStatus operator()(const ReportOptions& options) const { return runReport(options); }
     ExitStatus operator()(const WebOptions& options) const { return runWeb(options); }
+    ExitStatus operator()(const StoreLoadOptions& options) const { return runStoreLoad(options); }
+    ExitStatus operator()(const StoreWatchOptions& options) const { return runStoreWatch(options); }
+    ExitStatus operator()(const StoreAskOptions& options) const { return runStoreAsk(options); }
     ExitStatus operator()(const ModemListOptions& options) const { return runModemList(options); }
     ExitStatus operator()(const ModemPolicyOptions& options) const {
         return runModemPolicy(options);

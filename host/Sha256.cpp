@@ -57,4 +57,10 @@ std::string Sha256::finish() {
     return text;
 }
 
+std::string Sha256::soFar() const {
+    Sha256 copy;
+    require(EVP_MD_CTX_copy_ex(copy._state.get(), _state.get()) == 1);
+    return copy.finish();
+}
+
 } // namespace pallax

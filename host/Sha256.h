@@ -25,6 +25,8 @@ public:
     Digest finishBytes();
     /// The same as 64 hexadecimal digits.
     std::string finish();
+    /// The digest of what was added so far; more can be added.
+    std::string soFar() const;
 
 private:
     struct Free {

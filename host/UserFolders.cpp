@@ -6,16 +6,29 @@
 
 namespace pallax {
 
-std::optional<std::filesystem::path> configurationFolder() {
-    const char* configuration = std::getenv("XDG_CONFIG_HOME"); // NOLINT(concurrency-mt-unsafe)
-    const char* home = std::getenv("HOME");                     // NOLINT(concurrency-mt-unsafe)
-    if (configuration != nullptr && *configuration == '/') {
-        return configuration;
+namespace {
+
+/// The folder that a variable names, or one of the home folder.
+std::optional<std::filesystem::path> userFolder(const char* variable, const char* usual) {
+    const char* chosen = std::getenv(variable); // NOLINT(concurrency-mt-unsafe)
+    const char* home = std::getenv("HOME");     // NOLINT(concurrency-mt-unsafe)
+    if (chosen != nullptr && *chosen == '/') {
+        return chosen;
     }
     if (home != nullptr && *home != '\0') {
-        return std::filesystem::path(home) / ".config";
+        return std::filesystem::path(home) / usual;
     }
     return std::nullopt;
+}
+
+} // namespace
+
+std::optional<std::filesystem::path> configurationFolder() {
+    return userFolder("XDG_CONFIG_HOME", ".config");
+}
+
+std::optional<std::filesystem::path> dataFolder() {
+    return userFolder("XDG_DATA_HOME", ".local/share");
 }
 
 std::vector<std::filesystem::path> dataFolders() {

@@ -47,16 +47,17 @@ bool names(const FieldInfo& field, const FieldValue& value) {
 
 } // namespace
 
-CellFinder::CellFinder(const Timeline& timeline) : _timeline(timeline) {
+CellFinder::CellFinder(const FieldTable& fieldTable, const EntryTable& entries)
+    : _fields(fieldTable), _entries(entries) {
     for (const CellFields& fields : cellFields()) {
-        if (timeline.fields().named(fields.code)) {
+        if (_fields.named(fields.code)) {
             addRule(fields);
         }
     }
 }
 
 CellFinder::Slot CellFinder::slotOf(std::string_view field) {
-    const auto index = _timeline.fields().named(field);
+    const auto index = _fields.named(field);
     if (!index) {
         return kNone;
     }
@@ -76,7 +77,7 @@ void CellFinder::addRule(const CellFields& fields) {
     rule.networkColour = slotOf(fields.networkColour);
     rule.level = slotOf(levelBeside(fields));
     rule.isChannelBeside = groupOf(fields.channel) == groupOf(fields.code);
-    const auto& identity = _timeline.fields()[_watched[rule.code].field].identity;
+    const auto& identity = _fields[_watched[rule.code].field].identity;
     rule.isNamedByEntry = !identity.empty() && identity.front() == kEntryName;
     for (const std::string_view part : fields.area) {
         rule.area.push_back(slotOf(part));
@@ -84,16 +85,12 @@ void CellFinder::addRule(const CellFields& fields) {
     _rules.push_back(std::move(rule));
 }
 
-bool CellFinder::isWatched(const SampleReader::Item& item) const {
-    return item.field < _slots.size() && _slots[item.field] != kNone;
-}
-
 void CellFinder::take(const std::vector<SampleReader::Item>& items) {
     for (auto begin = items.begin(); begin != items.end();) {
         const auto end = std::find_if(begin, items.end(), [&](const SampleReader::Item& item) {
             return item.packet != begin->packet;
         });
-        if (std::any_of(begin, end, [this](const auto& item) { return isWatched(item); })) {
+        if (std::any_of(begin, end, [this](const auto& item) { return isWatched(item.field); })) {
             takePacket({begin, end});
         }
         begin = end;
@@ -103,7 +100,7 @@ void CellFinder::take(const std::vector<SampleReader::Item>& items) {
 void CellFinder::takePacket(std::span<const SampleReader::Item> items) {
     // The values outside lists come first: one can be the channel of a list's cells.
     for (const SampleReader::Item& item : items) {
-        if (item.entry == kNoEntry && isWatched(item)) {
+        if (item.entry == kNoEntry && isWatched(item.field)) {
             Watched& watched = _watched[_slots[item.field]];
             watched.latest = item.value;
             watched.now = &item.value;
@@ -115,7 +112,7 @@ void CellFinder::takePacket(std::span<const SampleReader::Item> items) {
         std::size_t to = from;
         // Entries without a number of their own begin again with their first field.
         do {
-            if (first.entry != kNoEntry && isWatched(items[to])) {
+            if (first.entry != kNoEntry && isWatched(items[to].field)) {
                 _watched[_slots[items[to].field]].now = &items[to].value;
             }
             ++to;
@@ -142,7 +139,7 @@ void CellFinder::takeRules(const SampleReader::Item& item, EntryId entry) {
 
 bool CellFinder::isReadNow(Slot slot) const {
     return slot != kNone && _watched[slot].now != nullptr &&
-           names(_timeline.fields()[_watched[slot].field], *_watched[slot].now);
+           names(_fields[_watched[slot].field], *_watched[slot].now);
 }
 
 bool CellFinder::isNamedNow(const Rule& rule) const {
@@ -158,7 +155,7 @@ FieldValue CellFinder::valueOf(Slot slot) const {
 
 FieldValue CellFinder::codeOf(const Rule& rule, EntryId entry) const {
     if (rule.isNamedByEntry) {
-        return numberInName(_timeline.entries().words(entry));
+        return numberInName(_entries.words(entry));
     }
     FieldValue code = valueOf(rule.code);
     const FieldValue colour = valueOf(rule.networkColour);
@@ -192,9 +189,9 @@ std::string CellFinder::identityOf(const Rule& rule, const FieldValue& code,
     };
     const CellTerms terms = cellTermsOf(rule.fields->system);
     const bool hasKeys = !rule.area.empty();
-    add(hasKeys ? _timeline.fields()[_watched[rule.code].field].key : terms.code, code);
+    add(hasKeys ? _fields[_watched[rule.code].field].key : terms.code, code);
     for (const Slot slot : rule.area) {
-        add(_timeline.fields()[_watched[slot].field].key, valueOf(slot));
+        add(_fields[_watched[slot].field].key, valueOf(slot));
     }
     add(terms.channel, channel);
     return identity;
@@ -221,6 +218,9 @@ void CellFinder::note(const Rule& rule, const SampleReader::Item& item, EntryId 
         cell.first = item.time;
         cell.packet = item.packet;
         _found.push_back(std::move(cell));
+    }
+    if (rule.fields->role == CellRole::Serving) {
+        _serving = place->second;
     }
     FoundCell& cell = _found[place->second];
     cell.last = item.time;

@@ -32,12 +32,21 @@ struct FoundCell {
 /// Finds the cells in the samples of packets.
 class CellFinder {
 public:
-    explicit CellFinder(const Timeline& timeline);
+    /// Both must outlive it.
+    CellFinder(const FieldTable& fields, const EntryTable& entries);
 
     /// Takes the samples of whole packets.
     void take(const std::vector<SampleReader::Item>& items);
     /// In the order of their first packets.
     std::vector<FoundCell> found() && { return std::move(_found); }
+    /// Those that were found so far; references do not stay valid.
+    const std::vector<FoundCell>& soFar() const { return _found; }
+    /// The place among them of the serving cell that was named last; nothing before the first.
+    std::optional<std::size_t> serving() const { return _serving; }
+    /// Whether a packet that reads this field can name a cell.
+    bool isWatched(FieldIndex field) const {
+        return field < _slots.size() && _slots[field] != kNone;
+    }
 
 private:
     static constexpr std::size_t kNone = static_cast<std::size_t>(-1);
@@ -62,7 +71,6 @@ private:
 
     Slot slotOf(std::string_view field);
     void addRule(const CellFields& fields);
-    bool isWatched(const SampleReader::Item& item) const;
     void takePacket(std::span<const SampleReader::Item> items);
     void takeRules(const SampleReader::Item& item, EntryId entry);
     bool isReadNow(Slot slot) const;
@@ -75,7 +83,9 @@ private:
                            const FieldValue& channel) const;
     void note(const Rule& rule, const SampleReader::Item& item, EntryId entry);
 
-    const Timeline& _timeline;
+    const FieldTable& _fields;
+    const EntryTable& _entries;
+    std::optional<std::size_t> _serving;
     std::vector<Rule> _rules;
     std::vector<Watched> _watched;
     std::vector<Slot> _slots; ///< by field

@@ -103,7 +103,7 @@ public:
         if (!_cells || _packets != _timeline.packets()) {
             RowBounds all;
             all.mayContinue = bounds.mayContinue;
-            CellFinder finder(_timeline);
+            CellFinder finder(_timeline.fields(), _timeline.entries());
             SampleReader reader(_timeline, packetsIn(_timeline, all));
             while (reader.readMore()) {
                 finder.take(reader.items());

@@ -186,14 +186,31 @@ void Database::Close::operator()(sqlite3* connection) const {
 }
 
 Database::Database() : _authority(std::make_unique<Authority>()), _schemas{"main"} {
+    open(":memory:", SQLITE_OPEN_READWRITE | SQLITE_OPEN_MEMORY);
+}
+
+Database::Database(const std::string& file)
+    : _authority(std::make_unique<Authority>()), _schemas{"main"} {
+    // SQLite takes no other name for a file, whatever it begins with.
+    // Only who may write a file tidies up after a writer that was killed; queries do not write.
+    open(file.starts_with('/') ? file : "./" + file, SQLITE_OPEN_READWRITE);
+    run(*_connection, "PRAGMA query_only = true");
+    // Anybody may have made it.
+    sqlite3_db_config(_connection.get(), SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
+    sqlite3_db_config(_connection.get(), SQLITE_DBCONFIG_TRUSTED_SCHEMA, 0, nullptr);
+    constexpr int kMostWait = 10'000; // milliseconds, for a writer that recovers the file
+    sqlite3_busy_timeout(_connection.get(), kMostWait);
+}
+
+void Database::open(const std::string& name, int flags) {
     limitQueryMemory();
     sqlite3* connection = nullptr;
     const int result =
-        sqlite3_open_v2(":memory:", &connection,
-                        SQLITE_OPEN_READWRITE | SQLITE_OPEN_MEMORY | SQLITE_OPEN_NOMUTEX, nullptr);
+        sqlite3_open_v2(name.c_str(), &connection, flags | SQLITE_OPEN_NOMUTEX, nullptr);
     _connection.reset(connection);
     if (result != SQLITE_OK) {
-        throw std::runtime_error("no memory for queries");
+        throw std::runtime_error(connection != nullptr ? sqlite3_errmsg(connection)
+                                                       : "no memory for queries");
     }
     sqlite3_limit(connection, SQLITE_LIMIT_LENGTH, kLongestText);
     sqlite3_limit(connection, SQLITE_LIMIT_SQL_LENGTH, kLongestText);

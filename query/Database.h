@@ -74,6 +74,9 @@ class Database {
 public:
     /// Throws std::runtime_error without memory.
     Database();
+    /// Has the tables of a file, which it only reads. Throws std::runtime_error if it cannot be
+    /// opened.
+    explicit Database(const std::string& file);
     ~Database();
     Database(const Database&) = delete;
     Database& operator=(const Database&) = delete;
@@ -108,6 +111,8 @@ private:
     struct Close {
         void operator()(sqlite3* connection) const;
     };
+
+    void open(const std::string& name, int flags);
 
     struct Named {
         std::string schema;

@@ -166,8 +166,8 @@ bool addPrintfAs(const char* name, sqlite3& connection) {
     }
     constexpr int kAnyNumber = -1;
     return sqlite3_create_function_v2(&connection, name, kAnyNumber,
-                                      SQLITE_UTF8 | SQLITE_DETERMINISTIC, made.release(),
-                                      callPrintf, nullptr, nullptr, [](void* held) {
+                                      SQLITE_UTF8 | SQLITE_DETERMINISTIC | SQLITE_INNOCUOUS,
+                                      made.release(), callPrintf, nullptr, nullptr, [](void* held) {
                                           std::unique_ptr<Printf>(static_cast<Printf*>(held));
                                       }) == SQLITE_OK;
 }

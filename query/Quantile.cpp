@@ -13,6 +13,21 @@ namespace {
 struct Weighted {
     std::vector<std::pair<double, double>> values; ///< with their weights
     double share = 0;
+    std::size_t most = 256; ///< values before equal ones are joined: levels have few different ones
+
+    void join() {
+        std::sort(values.begin(), values.end());
+        auto last = values.begin();
+        for (auto each = values.begin(); each != values.end(); ++each) {
+            if (each != last && each->first == last->first) {
+                last->second += each->second;
+            } else if (each != last) {
+                *++last = *each;
+            }
+        }
+        values.erase(values.empty() ? last : last + 1, values.end());
+        most = std::max(most, values.size() * 2);
+    }
 };
 
 bool isNumber(sqlite3_value* value) {
@@ -35,8 +50,12 @@ void step(sqlite3_context* context, int /*count*/, sqlite3_value** arguments) {
         *held = std::make_unique<Weighted>().release();
     }
     constexpr std::size_t kMostValues = std::size_t{8} << 20U; // 128 MiB
+    if ((*held)->values.size() >= (*held)->most) {
+        (*held)->join();
+    }
     if ((*held)->values.size() >= kMostValues) {
-        return sqlite3_result_error(context, "quantile() takes at most 8,388,608 values", -1);
+        return sqlite3_result_error(context, "quantile() takes at most 8,388,608 different values",
+                                    -1);
     }
     const double weight = sqlite3_value_double(arguments[1]);
     if (isNumber(arguments[0]) && weight > 0) {
@@ -55,7 +74,7 @@ void finish(sqlite3_context* context) {
     if (values.empty()) {
         return;
     }
-    std::sort(values.begin(), values.end());
+    weighted->join();
     double all = 0;
     for (const auto& [value, weight] : values) {
         all += weight;

@@ -2,10 +2,9 @@
 
 #include "packets/StampSequence.h"
 #include "query/SampleReader.h"
+#include "timeline/SpanMaker.h"
 
-#include <algorithm>
 #include <deque>
-#include <unordered_map>
 
 namespace pallax {
 
@@ -40,52 +39,38 @@ public:
                 takeItems();
             } else {
                 _isAtEnd = true;
-                endAll();
+                _spans.endAll();
             }
         }
         return true;
     }
     std::int64_t number(std::int64_t /*place*/) const override {
-        return _ended.front().begin.number();
+        return SampleReader::numberInPacket(_ended.front().packet, _ended.front().place);
     }
     void give(std::size_t column, ColumnValue& value) const override {
         const Span& span = _ended.front();
         switch (column) {
         case kStart:
-            return value.integer(microseconds(span.begin.time));
+            return value.integer(microseconds(span.start));
         case kPacket:
-            return value.integer(static_cast<std::int64_t>(span.begin.packet));
+            return value.integer(static_cast<std::int64_t>(span.packet));
         case kField:
-            return value.text(_timeline.fields()[span.begin.field].name);
+            return value.text(_timeline.fields()[span.field].name);
         case kEntry:
-            return span.begin.entry != kNoEntry
-                       ? value.text(_timeline.entries().words(span.begin.entry))
-                       : void();
+            return span.entry != kNoEntry ? value.text(_timeline.entries().words(span.entry))
+                                          : void();
         case kHold:
-            return value.integer(microseconds(span.end) - microseconds(span.begin.time));
+            return value.integer(microseconds(span.end) - microseconds(span.start));
         case kNumber:
-            return giveNumber(span.begin.value, value);
+            return giveNumber(span.value, value);
         case kText:
-            return value.text(span.begin.value.text());
+            return value.text(span.value.text());
         default:
-            return value.text(_timeline.fields()[span.begin.field].unit);
+            return value.text(_timeline.fields()[span.field].unit);
         }
     }
 
 private:
-    struct Span {
-        SampleReader::Item begin;
-        Time end;
-        std::uint64_t lastRead = 0; ///< the packet
-        ListId list = 0;
-    };
-    using Key = std::uint64_t; ///< field and entry
-
-    static Key keyOf(FieldIndex field, EntryId entry) {
-        constexpr unsigned kHalf = 32;
-        return std::uint64_t{field} << kHalf | entry;
-    }
-
     void takeItems() {
         std::size_t gone = 0;
         const auto& items = _reader.items();
@@ -94,79 +79,36 @@ private:
                 take(_reader.gone()[gone]);
             }
             if (index < items.size()) {
-                take(items[index]);
+                const SampleReader::Item& item = items[index];
+                goTo(item.packet, item.time);
+                _spans.valueRead(item.field, item.entry, item.value, item.place);
             }
         }
     }
     void goTo(std::uint64_t packet, Time time) {
         if (packet != _packet) {
-            endReplaced();
             if (_stamps.stepTo(time)) {
-                endAll(); // what was between is unknown
+                _spans.endAll(); // what was between is unknown
             }
             _stamps.take(time);
+            _spans.beginPacket(packet, time);
             _packet = packet;
-            _time = time;
         }
     }
     void take(const SampleReader::Gone& gone) {
         goTo(gone.packet, gone.time);
-        if (!gone.field) {
-            if (gone.list != 0) {
-                _list = gone.list;
-                _replaced.push_back(gone.list);
-            }
-            return;
-        }
-        end(_open.find(keyOf(*gone.field, kNoEntry)), _time);
-    }
-    void take(const SampleReader::Item& item) {
-        goTo(item.packet, item.time);
-        const Key key = keyOf(item.field, item.entry);
-        auto found = _open.find(key);
-        if (found != _open.end() && !(found->second.begin.value == item.value)) {
-            end(found, item.time);
-            found = _open.end();
-        }
-        if (found == _open.end()) {
-            found = _open.emplace(key, Span{item, {}, 0, item.entry != kNoEntry ? _list : 0}).first;
-        }
-        found->second.lastRead = item.packet;
-    }
-    /// Ends the spans of entries that the packet's lists no longer have.
-    void endReplaced() {
-        for (const ListId list : _replaced) {
-            for (auto each = _open.begin(); each != _open.end();) {
-                const auto span = each++;
-                if (span->second.list == list && span->second.lastRead != _packet) {
-                    end(span, _time);
-                }
-            }
-        }
-        _replaced.clear();
-    }
-    void endAll() {
-        endReplaced();
-        while (!_open.empty()) {
-            end(_open.begin(), _time);
-        }
-    }
-    void end(std::unordered_map<Key, Span>::iterator span, Time time) {
-        if (span != _open.end()) {
-            span->second.end = std::max(time, span->second.begin.time);
-            _ended.push_back(std::move(span->second));
-            _open.erase(span);
+        if (gone.field) {
+            _spans.valueRemoved(*gone.field);
+        } else if (gone.list != 0) {
+            _spans.listReplaced(gone.list);
         }
     }
 
     Timeline& _timeline;
     SampleReader _reader;
-    std::unordered_map<Key, Span> _open;
-    std::deque<Span> _ended;
-    std::vector<ListId> _replaced; ///< by the current packet
-    ListId _list = 0;
+    SpanMaker _spans;
+    std::deque<Span>& _ended = _spans.ended();
     std::uint64_t _packet = 0;
-    Time _time;
     StampSequence _stamps;
     bool _isAtEnd = false;
 };

@@ -3,6 +3,7 @@
 #include "decoding/DisplayJson.h"
 #include "fields/Reference.h"
 #include "platform/RecordedTechnology.h"
+#include "report/ReportWalk.h"
 #include "timeline/Timeline.h"
 #include "web/SeriesJson.h"
 
@@ -62,9 +63,8 @@ void LiveData::take(const ShownTick& tick, const CurrentValues& values) {
     if (_ticks.empty() || time < _ticks.back().tick.time) {
         _stretches.push_back(_ticks.size());
     }
-    const Stretch* stretch = _timeline->stretchOfInstant(tick.packet);
-    _report->take({time, values, PropertyList(), isAfterStep,
-                   stretch != nullptr ? stretch->firstPacket : 0});
+    _report->take(
+        {time, values, PropertyList(), isAfterStep, firstPacketAround(*_timeline, tick.packet)});
     _ticks.push_back(tick);
     _isUpToDate = false;
 }

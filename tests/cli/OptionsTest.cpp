@@ -285,7 +285,7 @@ TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
     for (const char* command :
          {"",       "decode",  "record", "service",  "demo",       "simulate", "events",
           "fields", "explain", "info",   "snapshot", "sql",        "status",   "diff",
-          "watch",  "report",  "mask",   "verify",   "completion", "manual"}) {
+          "watch",  "report",  "mask",   "verify",   "completion", "manual",   "store"}) {
         std::vector<std::string> arguments;
         if (*command != '\0') {
             arguments.emplace_back(command);

@@ -49,7 +49,7 @@ TEST_F(Completion, BashOffersCommands) {
     EXPECT_EQ(inBash("pallax de", 1), "decode\ndemo\n");
     EXPECT_EQ(inBash("pallax f", 1), "fields\n");
     folder.write("seven.pcap", "");
-    EXPECT_EQ(inBash("pallax s", 1), "service\nsimulate\nsnapshot\nsql\nstatus\nseven.pcap\n")
+    EXPECT_EQ(inBash("pallax s", 1), "service\nsimulate\nsnapshot\nsql\nstatus\nstore\nseven.pcap\n")
         << "and files";
 }
 
@@ -68,6 +68,7 @@ TEST_F(Completion, BashOffersTheChoicesOfAnOption) {
     EXPECT_EQ(inBash("pallax --log-level ''", 2), "0\n1\n2\n3\n4\n5\n6\n7\n");
     EXPECT_EQ(inBash("pallax demo ''", 2), "ifx\ngsm\ncdma\nlte\nutran\n");
     EXPECT_EQ(inBash("pallax fields c", 2), "cdma\n");
+    EXPECT_EQ(inBash("pallax store l", 2), "load\n");
     EXPECT_EQ(inBash("pallax explain --profile f", 3), "field\n");
     EXPECT_EQ(inBash("pallax demo --seed ''", 3), "") << "numbers are not completed";
 }
@@ -84,7 +85,7 @@ TEST_F(Completion, BashOffersFilesWhereARecordingOrFileIsTaken) {
 
 TEST_F(Completion, EveryOptionIsInEveryScript) {
     const CommandDescription program = CommandLine().description();
-    ASSERT_EQ(program.commands.size(), 19U);
+    ASSERT_EQ(program.commands.size(), 20U);
     const std::string fish = script("fish");
     for (const CommandDescription& command : program.commands) {
         ASSERT_GE(command.options.size(), 3U);

@@ -32,11 +32,11 @@ CommandDescription program() {
 TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
     EXPECT_EQ(manualPages(program()),
               (std::vector<std::string>{
-                  "pallax",        "pallax-decode",  "pallax-record",   "pallax-service",
-                  "pallax-demo",   "pallax-modem",   "pallax-simulate", "pallax-events",
-                  "pallax-fields", "pallax-explain", "pallax-info",     "pallax-snapshot",
-                  "pallax-sql",    "pallax-status",  "pallax-diff",     "pallax-watch",
-                  "pallax-report", "pallax-web",     "pallax-mask",     "pallax-verify"}));
+                  "pallax", "pallax-decode", "pallax-record", "pallax-service", "pallax-demo",
+                  "pallax-modem", "pallax-simulate", "pallax-events", "pallax-fields",
+                  "pallax-explain", "pallax-info", "pallax-snapshot", "pallax-sql", "pallax-status",
+                  "pallax-diff", "pallax-watch", "pallax-report", "pallax-web", "pallax-mask",
+                  "pallax-verify", "pallax-store"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 

@@ -1,0 +1,240 @@
+#include "cli/StoreRequest.h"
+
+#include "cli/OptionParts.h"
+#include "text/Format.h"
+
+#include <map>
+#include <utility>
+
+namespace pallax {
+
+namespace {
+
+constexpr const char* kStoreFooter = R"(Examples:
+  pallax store load --device car1 monday/*.pcapng
+  pallax store load --into fleet.db --pseudonyms key recordings/*.pcapng.gz
+  pallax store watch --into fleet.db arriving
+  pallax store query cells --below -110
+  pallax store query series measured_rsrp --device car1 --every 1h
+  pallax store query compare 2026-11-20 2026-11-21
+  pallax store query --sql "select * from event where kind = 'service-lost'"
+
+A store is one file that holds the measurements of many recordings and devices:
+every value for as long as it held, in which cell. --into and --store name it;
+the usual one is measurements.db in $XDG_DATA_HOME/pallax.
+
+load reads recordings and tells what became of each. A recording is known by its
+packets: loading it again changes nothing, wherever the file is. It is replaced
+when a newer version of pallax reads it, when it is to be read otherwise, or
+when it has grown. Each is stored whole or not at all, so load can be ended at
+any time and run again. A damaged recording is loaded up to where it is whole.
+Only files can be loaded.
+
+The device of a recording is the name of its folder, unless --device names it.
+Values are those that the display shows at its ticks, every two seconds, and a
+level that was read more than 10 s ago is not known any more; --every packet
+keeps each value that was read, as the table "span" of pallax sql has it, in
+more than ten times the space. What identifies a person is left out, or replaced by
+pseudonyms (--pseudonyms; see pallax mask --help): with the same key, the same
+person is the same in all recordings.
+
+watch loads the recordings in FOLDER and in the folders in it, and then each one
+that appears there (.pcap and .pcapng, also .gz and .zst), when it is written or
+moved, until Ctrl-C.
+
+query answers one of these questions:
+
+devices, recordings: what the store holds.
+
+cells: the serving cells, the worst first: for how long the level was known, for
+which share of that time it was below a border, since when, and the values that
+were not exceeded for 5, 50 and 95 % of the time. The levels are those that the
+status shows; --level takes a field, the end of its name, or a measure (rsrp).
+The border is --below or, by default, where the profile's grade "fair" ends.
+
+series FIELD: the course of a field of numbers in steps (--every 1m), for each
+device and list entry: least, mean and greatest value, and for which share of
+the step it was known.
+
+compare A B: the levels of two devices, recordings or days (2026-11-20, in UTC),
+and the events of each kind per hour.
+
+coverage: for each device and level, for which share of the time it had each
+grade of the profile.
+
+--sql: a query on the views span, event, cell and field, which are those of
+pallax-sql(7) with the columns device and recording; on measurement, which
+also tells the serving cell; or on the tables of the file, which sqlite3 opens,
+too. Times of values are in whole milliseconds.
+
+Exit status:
+  0   success, or the reader of the output has gone
+  1   failure: a recording was refused or is damaged, or the store cannot be
+      read or written, as a sentence on standard error tells
+  2   wrong usage, or a wrong query)";
+
+using Question = StoreAskOptions::Question;
+
+void addLoading(CLI::App& app, StoreRequest& request) {
+    app.add_option("--device", request.loading.device,
+                   "The device of the recordings; of a question, only this device")
+        ->type_name("NAME");
+    app.add_option("--pseudonyms", request.loading.keyFile,
+                   "Store pseudonyms of what identifies a person")
+        ->type_name("KEYFILE");
+    constexpr unsigned kMostJobs = 1024;
+    app.add_option_function<std::string>(
+           "--jobs",
+           [&request](const std::string& text) {
+               request.jobs = numberOf("--jobs", text, 1U, kMostJobs);
+           },
+           "How many recordings to load at once (default: one per core)")
+        ->type_name("N");
+}
+
+/// "30s", "1m", "6h", "1d".
+std::chrono::nanoseconds stepOf(const std::string& text) {
+    static const std::map<char, std::chrono::seconds> units{{'s', std::chrono::seconds(1)},
+                                                            {'m', std::chrono::minutes(1)},
+                                                            {'h', std::chrono::hours(1)},
+                                                            {'d', std::chrono::days(1)}};
+    const auto unit = units.find(text.empty() ? ' ' : text.back());
+    if (unit == units.end()) {
+        throw CLI::ValidationError("--every", "\"" + text +
+                                                  "\" is not tick, packet or a time "
+                                                  "(30s, 1m, 6h, 1d)");
+    }
+    constexpr int kMost = 1000;
+    return unit->second * numberOf("--every", text.substr(0, text.size() - 1), 1, kMost);
+}
+
+/// --every tick|packet of a load, or a duration of a series.
+void addEvery(CLI::App& app, StoreRequest& request) {
+    const auto take = [&request](const std::string& text) {
+        if (text == "tick" || text == "packet") {
+            request.loading.resolution = text == "tick" ? Resolution::Tick : Resolution::Packet;
+            return;
+        }
+        request.asking.every = stepOf(text);
+    };
+    app.add_option_function<std::string>(
+           "--every", take,
+           "Load the values at display ticks (the default) or of each packet; of a series, the "
+           "length of a step (default: 1m)")
+        ->type_name("tick|packet|TIME");
+}
+
+void addAsking(CLI::App& app, StoreAskOptions& asking) {
+    app.add_option("--level", asking.levels, "The levels of cells (default: those of the status)")
+        ->type_name("FIELD");
+    app.add_option("--below", asking.below, "The border of a bad level (default: of the profile)")
+        ->type_name("NUMBER");
+    app.add_option("--entry", asking.entry, "Only this list entry of a series")->type_name("WORDS");
+    app.add_option("--profile", asking.profile, "The profile that judges levels (default: android)")
+        ->type_name("android|field|operator|NAME");
+    addChoice<RowFormat>(
+        app, "--format", asking.format,
+        {{"table", RowFormat::Table}, {"csv", RowFormat::Csv}, {"json", RowFormat::Json}},
+        "How to write the rows (default: table)");
+    app.add_option_function<std::string>(
+           "--timeout",
+           [&asking](const std::string& text) {
+               const auto seconds = parseSeconds(text);
+               if (!seconds) {
+                   throw CLI::ValidationError("--timeout", seconds.error());
+               }
+               asking.timeout = *seconds;
+           },
+           "Stop a question after this time")
+        ->type_name("SECONDS");
+}
+
+/// The question of the first word, and how many words follow it.
+const std::vector<std::pair<std::string, std::pair<Question, std::size_t>>>& questions() {
+    static const std::vector<std::pair<std::string, std::pair<Question, std::size_t>>> all{
+        {"devices", {Question::Devices, 0}}, {"recordings", {Question::Recordings, 0}},
+        {"cells", {Question::Cells, 0}},     {"series", {Question::Series, 1}},
+        {"compare", {Question::Compare, 2}}, {"coverage", {Question::Coverage, 0}}};
+    return all;
+}
+
+ParsedOptions askOptions(const StoreRequest& request) {
+    StoreAskOptions asking = request.asking;
+    asking.device = request.loading.device;
+    asking.store = request.loading.store;
+    std::vector<std::string> words = request.words;
+    if (request.sql) {
+        if (words.size() != 1) {
+            return wrongUsage("--sql takes one query", "store");
+        }
+        asking.words = words;
+        return asking;
+    }
+    std::string names;
+    for (const auto& [name, question] : questions()) {
+        names += (names.empty() ? "" : "|") + name;
+        if (words.empty() || words.front() != name) {
+            continue;
+        }
+        words.erase(words.begin());
+        if (words.size() != question.second) {
+            return wrongUsage(
+                formatText("%@ takes %@", {name, question.second == 0   ? "no words"
+                                                 : question.second == 1 ? "a field"
+                                                                        : "two words"}),
+                "store");
+        }
+        asking.question = question.first;
+        asking.words = words;
+        return asking;
+    }
+    return wrongUsage(words.empty()
+                          ? "query takes a question (" + names + ") or --sql"
+                          : std::string(unknownChoice("query", words.front(), names).what()),
+                      "store");
+}
+
+} // namespace
+
+void addStore(CLI::App& app, StoreRequest& request) {
+    addChoice<StoreRequest::Action>(app, "ACTION", request.action,
+                                    {{"load", StoreRequest::Action::Load},
+                                     {"query", StoreRequest::Action::Query},
+                                     {"watch", StoreRequest::Action::Watch}},
+                                    "What to do")
+        ->required();
+    app.add_option(
+           "WORDS", request.words,
+           "The recordings to load (pcap or pcapng), or a question: devices, recordings, "
+           "cells, series FIELD, compare A B, coverage or, with --sql, a query; or the folder to "
+           "watch")
+        ->type_name("");
+    app.add_option("--into,--store", request.loading.store,
+                   "The file of the store (default: measurements.db in the folder for data)")
+        ->type_name("FILE");
+    addLoading(app, request);
+    addEvery(app, request);
+    addAsking(app, request.asking);
+    app.add_flag("--sql", request.sql, "The question is a query in SQL");
+    app.footer(kStoreFooter);
+}
+
+ParsedOptions storeOptions(const StoreRequest& request) {
+    if (request.action == StoreRequest::Action::Query) {
+        return askOptions(request);
+    }
+    if (request.action == StoreRequest::Action::Load && request.words.empty()) {
+        return wrongUsage("load takes recordings", "store");
+    }
+    if (request.loading.device && request.loading.device->empty()) {
+        return wrongUsage("a device has a name", "store");
+    }
+    if (request.action == StoreRequest::Action::Watch) {
+        return request.words.size() == 1
+                   ? ParsedOptions(StoreWatchOptions{request.loading, request.words.front()})
+                   : wrongUsage("watch takes one folder", "store");
+    }
+    return StoreLoadOptions{request.loading, request.words, request.jobs};
+}
+
+} // namespace pallax

@@ -1,0 +1,27 @@
+#pragma once
+
+#include "cli/Options.h"
+
+#include <string>
+#include <vector>
+
+namespace pallax {
+
+/// What the user wants of a store.
+struct StoreRequest {
+    enum class Action { Load, Query, Watch };
+
+    Action action = Action::Load;
+    LoadingOptions loading = {};
+    std::optional<unsigned> jobs = {};
+    StoreAskOptions asking = {};
+    std::vector<std::string> words = {}; ///< recordings, a question, or a folder
+    bool sql = false;                    ///< the question is a query
+};
+
+void addStore(CLI::App& app, StoreRequest& request);
+
+/// The options of what is wanted, or an error.
+ParsedOptions storeOptions(const StoreRequest& request);
+
+} // namespace pallax

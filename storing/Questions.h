@@ -1,0 +1,32 @@
+#pragma once
+
+#include "knowledge/Quality.h"
+#include "storing/StoreOptions.h"
+#include "text/Result.h"
+
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace pallax {
+
+/// A level of cells, which one or several fields tell.
+struct JudgedLevel {
+    std::string name; ///< "LTE RSRP"; of a field that no status shows, its own
+    std::vector<std::string> fields;
+    Borders borders;              ///< of the profile; empty if it does not judge the level
+    std::optional<double> border; ///< where it begins to be bad; nothing: unknown
+};
+
+/// The levels that a question is about: those that the status shows of serving cells, those of one
+/// measure, or one field by its name or the end of it. Nothing if `choice` is none of these.
+std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<double> below,
+                                      const QualityProfile& profile);
+
+/// A text as SQL has it.
+std::string quotedText(const std::string& text);
+
+/// The query that answers a question, on the views of a store.
+std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels);
+
+} // namespace pallax

@@ -1,0 +1,94 @@
+#include "tests/cli/ParsedOptions.h"
+
+namespace pallax {
+namespace {
+
+using Question = StoreAskOptions::Question;
+
+std::string refusal(std::vector<std::string> arguments) {
+    const ParseEnd end = ended(std::move(arguments));
+    EXPECT_EQ(end.status, kExitWrongUsage);
+    return end.text;
+}
+
+TEST(StoreOptions, LoadTakesRecordings) {
+    const auto usual = parsed<StoreLoadOptions>({"store", "load", "a.pcap", "b.pcap"});
+    EXPECT_EQ(usual.recordings, (std::vector<std::string>{"a.pcap", "b.pcap"}));
+    EXPECT_EQ(usual.loading.store, "");
+    EXPECT_EQ(usual.loading.device, std::nullopt);
+    EXPECT_EQ(usual.loading.resolution, Resolution::Tick);
+    EXPECT_EQ(usual.loading.keyFile, "");
+    EXPECT_EQ(usual.jobs, std::nullopt);
+    const auto told =
+        parsed<StoreLoadOptions>({"store", "load", "--into", "fleet.db", "--device", "car1",
+                                  "--every", "packet", "--pseudonyms", "key", "--jobs", "3", "a"});
+    EXPECT_EQ(told.loading.store, "fleet.db");
+    EXPECT_EQ(told.loading.device, "car1");
+    EXPECT_EQ(told.loading.resolution, Resolution::Packet);
+    EXPECT_EQ(told.loading.keyFile, "key");
+    EXPECT_EQ(told.jobs, 3U);
+}
+
+TEST(StoreOptions, QueryTakesAQuestion) {
+    const auto series = parsed<StoreAskOptions>({"store", "query", "series", "rsrp", "--device",
+                                                 "car1", "--every", "6h", "--entry", "PCI 1",
+                                                 "--store", "fleet.db", "--format", "csv"});
+    EXPECT_EQ(series.question, Question::Series);
+    EXPECT_EQ(series.words, std::vector<std::string>{"rsrp"});
+    EXPECT_EQ(series.device, "car1");
+    EXPECT_EQ(series.every, std::chrono::hours(6));
+    EXPECT_EQ(series.entry, "PCI 1");
+    EXPECT_EQ(series.store, "fleet.db");
+    EXPECT_EQ(series.format, RowFormat::Csv);
+    const auto cells = parsed<StoreAskOptions>(
+        {"store", "query", "cells", "--below", "-110", "--level", "rsrp", "--profile", "field"});
+    EXPECT_EQ(cells.question, Question::Cells);
+    EXPECT_EQ(cells.below, -110.0);
+    EXPECT_EQ(cells.levels, "rsrp");
+    EXPECT_EQ(cells.profile, "field");
+    EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "compare", "a", "b"}).words,
+              (std::vector<std::string>{"a", "b"}));
+    EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "devices"}).question, Question::Devices);
+    EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "recordings"}).question,
+              Question::Recordings);
+    EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "coverage"}).question, Question::Coverage);
+    const auto sql = parsed<StoreAskOptions>({"store", "query", "--sql", "select 1"});
+    EXPECT_EQ(sql.question, Question::Sql);
+    EXPECT_EQ(sql.words, std::vector<std::string>{"select 1"});
+}
+
+TEST(StoreOptions, WatchTakesAFolder) {
+    const auto watch = parsed<StoreWatchOptions>({"store", "watch", "--into", "s.db", "arriving"});
+    EXPECT_EQ(watch.folder, "arriving");
+    EXPECT_EQ(watch.loading.store, "s.db");
+    EXPECT_EQ(refusal({"store", "watch"}),
+              "pallax: watch takes one folder (see pallax store --help)\n");
+}
+
+TEST(StoreOptions, WrongOnesAreToldInASentence) {
+    EXPECT_EQ(refusal({"store", "load"}),
+              "pallax: load takes recordings (see pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "load", "--device", "", "a"}),
+              "pallax: a device has a name (see pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "query"}),
+              "pallax: query takes a question (devices|recordings|cells|series|compare|coverage) "
+              "or --sql (see pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "query", "cell"}),
+              "pallax: query: \"cell\" is not one of "
+              "devices|recordings|cells|series|compare|coverage. Did you mean \"cells\"? (see "
+              "pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "query", "series"}),
+              "pallax: series takes a field (see pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "query", "compare", "a"}),
+              "pallax: compare takes two words (see pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "query", "devices", "a"}),
+              "pallax: devices takes no words (see pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "query", "--sql"}),
+              "pallax: --sql takes one query (see pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "query", "series", "rsrp", "--every", "often"}),
+              "pallax: --every: \"often\" is not tick, packet or a time (30s, 1m, 6h, 1d) (see "
+              "pallax store --help)\n");
+}
+
+} // namespace
+} // namespace pallax
