@@ -85,14 +85,16 @@ TEST_F(EndToEndProgress, OfAFileIsTheShareOfItsBytes) {
     const std::string drive = world.path("drive.pcap");
     const std::string written = world.path("written");
     ASSERT_EQ(run({"simulate", "lte", "--seconds", "60", "-o", drive}).status, 0);
+    const std::string shown = world.path("shown");
     // A slow reader of the output slows the reading of the file.
-    const std::string slowly = "{ sleep 1; for each in $(seq 12); do head -c 300000; sleep 0.2; "
-                               "done; cat; }";
+    const std::string slowly =
+        "{ until [ -e " + shown + " ]; do head -c 100000; sleep 0.2; done; cat; }";
     PallaxTerminal terminal(world,
                             {"-c", doubles::programPath() + " decode --every packet " + drive +
                                        " | " + slowly + " >" + written},
                             {.program = "/bin/sh"});
     EXPECT_TRUE(terminal.shows("#"));
+    std::ofstream{shown};
     EXPECT_EQ(terminal.wait(), 0);
     const std::string screen = terminal.screen().text();
     EXPECT_EQ(screen.find_first_not_of('\n'), std::string::npos) << screen;
