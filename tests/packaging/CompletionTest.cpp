@@ -49,7 +49,8 @@ TEST_F(Completion, BashOffersCommands) {
     EXPECT_EQ(inBash("pallax de", 1), "decode\ndemo\n");
     EXPECT_EQ(inBash("pallax f", 1), "fields\n");
     folder.write("seven.pcap", "");
-    EXPECT_EQ(inBash("pallax s", 1), "service\nsimulate\nsnapshot\nsql\nstatus\nstore\nseven.pcap\n")
+    EXPECT_EQ(inBash("pallax s", 1),
+              "service\nsimulate\nsnapshot\nsql\nstatus\nstore\nseven.pcap\n")
         << "and files";
 }
 

@@ -31,12 +31,13 @@ CommandDescription program() {
 
 TEST(ManualPage, ThereIsOneForTheProgramAndEachCommand) {
     EXPECT_EQ(manualPages(program()),
-              (std::vector<std::string>{
-                  "pallax", "pallax-decode", "pallax-record", "pallax-service", "pallax-demo",
-                  "pallax-modem", "pallax-simulate", "pallax-events", "pallax-fields",
-                  "pallax-explain", "pallax-info", "pallax-snapshot", "pallax-sql", "pallax-status",
-                  "pallax-diff", "pallax-watch", "pallax-report", "pallax-web", "pallax-mask",
-                  "pallax-verify", "pallax-store"}));
+              (std::vector<std::string>{"pallax",          "pallax-decode", "pallax-record",
+                                        "pallax-service",  "pallax-demo",   "pallax-modem",
+                                        "pallax-simulate", "pallax-events", "pallax-fields",
+                                        "pallax-explain",  "pallax-info",   "pallax-snapshot",
+                                        "pallax-sql",      "pallax-status", "pallax-diff",
+                                        "pallax-watch",    "pallax-report", "pallax-web",
+                                        "pallax-mask",     "pallax-verify", "pallax-store"}));
     EXPECT_EQ(manualPage(program(), "pallax-manual"), "");
 }
 

@@ -92,8 +92,8 @@ public:
 
     /// The timeline is another one: what is known of the old one is forgotten.
     void forgetTimeline();
-    /// Whether what identifies a person is hidden. Forgets what was shown, found or typed until now;
-    /// the caller then restarts the display.
+    /// Whether what identifies a person is hidden. Forgets what was shown, found or typed until
+    /// now; the caller then restarts the display.
     void setSafe(bool isSafe);
 
     /// Replaces the status text until the next key.
