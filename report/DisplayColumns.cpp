@@ -23,12 +23,45 @@ struct DisplayColumns::Node {
 
 namespace {
 
+constexpr std::string_view kLeftOut = "left out";
+
+PropertyList withLeftOutBelow(std::vector<std::string>& path, const PropertyList& value,
+                              const IsLeftOut& isLeftOut) {
+    const auto below = [&](std::string_view name, const PropertyList& each) {
+        path.emplace_back(name);
+        PropertyList shown = withLeftOutBelow(path, each, isLeftOut);
+        path.pop_back();
+        return shown;
+    };
+    if (const DictionaryRef dictionary = value.dictionary()) {
+        Dictionary shown = *dictionary; // with its marks, which have no row
+        for (const ShownEntry& entry : shownEntries(*dictionary)) {
+            shown.set(*entry.key, below(entry.name, *entry.value));
+        }
+        return shown;
+    }
+    if (const ArrayRef array = value.array()) {
+        Array shown;
+        std::size_t place = 0;
+        for (const PropertyList& each : *array) {
+            shown.push_back(each.isNull() ? each : below(std::to_string(place++), each));
+        }
+        return shown;
+    }
+    return isLeftOut(path) ? PropertyList(std::string(kLeftOut)) : value;
+}
+
 std::string textOf(const PropertyList& leaf) {
     const SharedBytes data = leaf.data();
     return data ? base64Text(*data) : leaf.string().value_or(leaf.description());
 }
 
 } // namespace
+
+PropertyList withLeftOut(const PropertyList& display, const IsLeftOut& isLeftOut) {
+    std::vector<std::string> path;
+    return withLeftOutBelow(path, display, isLeftOut);
+}
 
 DisplayColumns::DisplayColumns(IsLeftOut isLeftOut)
     : _isLeftOut(std::move(isLeftOut)), _root(std::make_unique<Node>()), _texts{{}} {}

@@ -16,6 +16,9 @@ namespace pallax {
 /// Whether the value at a path of the display is masked, so that it is not shown as what is left.
 using IsLeftOut = std::function<bool(const std::vector<std::string>& path)>;
 
+/// A display with the words "left out" in place of each such value.
+PropertyList withLeftOut(const PropertyList& display, const IsLeftOut& isLeftOut);
+
 /// The display at every tick, as one column for each place in it, kept where it changes.
 class DisplayColumns {
 public:
@@ -32,9 +35,6 @@ public:
         std::vector<std::string> path; ///< names of rows; an entry of an array has its position
         std::vector<Change> changes;
     };
-
-    /// The text of a value that is left out.
-    static constexpr std::string_view kLeftOut = "left out";
 
     explicit DisplayColumns(IsLeftOut isLeftOut = {});
     ~DisplayColumns();

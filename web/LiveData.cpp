@@ -2,6 +2,7 @@
 
 #include "decoding/DisplayJson.h"
 #include "fields/Reference.h"
+#include "masking/MaskedPlaces.h"
 #include "platform/RecordedTechnology.h"
 #include "report/ReportWalk.h"
 #include "timeline/Timeline.h"
@@ -29,18 +30,18 @@ LiveData::~LiveData() = default;
 void LiveData::begin(Timeline* timeline) {
     _follower.reset();
     _timeline = timeline;
-    const IsLeftOut isLeftOut = [](const auto& /*path*/) { return false; }; // it gets no display
-    _report = std::make_unique<ReportBuilder>(_setup.names, _setup.profile,
-                                              _setup.head.hasIdentities ? IsLeftOut() : isLeftOut);
     _ticks.clear();
     _stretches.clear();
     _stateTick = 0;
     _isUpToDate = false;
     if (timeline != nullptr) {
-        _follower = std::make_unique<TickFollower>(*timeline);
         const auto* technology = technologyOfCommandName(timeline->fields().technology());
         _setup.head.technology = gatherReference(*technology, _setup.resources).title;
+        _follower = std::make_unique<TickFollower>(*timeline);
+        _isLeftOut =
+            _setup.head.hasIdentities ? IsLeftOut() : maskedPlaces(*technology, _setup.resources);
     }
+    _report = std::make_unique<ReportBuilder>(_setup.names, _setup.profile, _isLeftOut);
 }
 
 bool LiveData::follow(const std::function<bool()>& mayContinue) {
@@ -140,7 +141,8 @@ std::optional<std::string> LiveData::state(Time at, std::size_t stretch) {
         _state = "{\"time\":";
         appendJson(_state, PropertyList::real(pageSeconds(shown.tick.time)));
         _state += ",\"tick\":" + std::to_string(shown.tick.number) + ",\"display\":";
-        appendJson(_state, _timeline->displayAt(shown.packet));
+        const PropertyList display = _timeline->displayAt(shown.packet);
+        appendJson(_state, _isLeftOut ? withLeftOut(display, _isLeftOut) : display);
         _state += '}';
         _stateTick = shown.tick.number;
     }

@@ -53,7 +53,7 @@ public:
                        std::size_t stretch) const;
     /// {"time":seconds,"tick":number,"display":{…}}: the display at the latest tick at or before a
     /// time in a stretch, or else at its first one whose packets are still there, as `decode`
-    /// prints it. Nothing if there is none.
+    /// prints it, but for what is left out. Nothing if there is none.
     std::optional<std::string> state(Time at, std::size_t stretch);
     /// The place of the latest stretch of time.
     std::size_t latestStretch() const { return std::max<std::size_t>(_stretches.size(), 1) - 1; }
@@ -69,6 +69,7 @@ private:
     Setup _setup;
     Timeline* _timeline = nullptr;
     std::unique_ptr<TickFollower> _follower;
+    IsLeftOut _isLeftOut; ///< none where nothing is masked
     std::unique_ptr<ReportBuilder> _report;
     std::vector<ShownTick> _ticks;
     std::vector<std::size_t> _stretches; ///< the places in `_ticks` where each begins

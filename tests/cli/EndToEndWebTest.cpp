@@ -51,7 +51,7 @@ TEST_F(EndToEndWeb, MasksIdentitiesUnlessToldOtherwise) {
         }
         PallaxProcess web(world, arguments);
         enter(web);
-        const std::string shown = withIdentities ? kIccid : std::string(19, '0');
+        const std::string shown = withIdentities ? kIccid : "left out";
         EXPECT_TRUE(eventually([&] {
             return get("/api/state?at=4000000000").find("\"EF-ICCID\":\"" + shown + '"') !=
                    std::string::npos;

@@ -144,5 +144,21 @@ TEST(DisplayColumns, SaysWhatIsLeftOut) {
     EXPECT_EQ(columns.texts()[columns.columns()[1]->changes[0].text], "000");
 }
 
+TEST(DisplayColumns, ADisplayCanBeHadWithoutWhatIsLeftOut) {
+    const auto isSecret = [](const std::vector<std::string>& path) {
+        return path.back() == "ICCID" || path == std::vector<std::string>{"Contexts", "1", "PDP"};
+    };
+    const Dictionary display{
+        {"SIM", Dictionary{{"_sorted", "yes"}, {"2;ICCID", "000"}, {"1;Slot", "000"}}},
+        {"Contexts",
+         Array{PropertyList(), Dictionary{{"PDP", "ims"}}, Dictionary{{"PDP", "web"}}}}};
+    EXPECT_EQ(
+        withLeftOut(display, isSecret),
+        PropertyList(Dictionary{
+            {"SIM", Dictionary{{"_sorted", "yes"}, {"2;ICCID", "left out"}, {"1;Slot", "000"}}},
+            {"Contexts",
+             Array{PropertyList(), Dictionary{{"PDP", "ims"}}, Dictionary{{"PDP", "left out"}}}}}));
+}
+
 } // namespace
 } // namespace pallax

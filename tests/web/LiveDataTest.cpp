@@ -35,7 +35,11 @@ protected:
     LiveData data{{names,
                    profile,
                    recorded.resources,
-                   {.title = "", .recording = "drive.pcap", .technology = "", .version = "1.2"}}};
+                   {.title = "",
+                    .recording = "drive.pcap",
+                    .technology = "",
+                    .version = "1.2",
+                    .hasIdentities = true}}};
 };
 
 TEST_F(LiveDataTest, BeforeAnyPacketThereIsNothing) {
@@ -54,7 +58,7 @@ TEST_F(LiveDataTest, FiguresAreThoseOfAReport) {
     EXPECT_EQ(head["recording"], "drive.pcap");
     EXPECT_EQ(head["technology"], "LTE");
     EXPECT_EQ(head["version"], "1.2");
-    EXPECT_EQ(head["identities"], "left out");
+    EXPECT_EQ(head["identities"], "included");
     EXPECT_EQ(head["packets"], recorded.journal.size());
     EXPECT_EQ(head["ticks"], 30);
     EXPECT_EQ(figures["measures"][0]["name"], "RSRP");
@@ -76,6 +80,19 @@ TEST_F(LiveDataTest, StatesAreDisplaysAsDecodePrintsThem) {
               pageSeconds(Simulation::kStart + 8s) +
                   (first["time"].get<double>() - pageSeconds(Simulation::kStart + 2s)));
     EXPECT_NE(state(Simulation::kStart + 9s)["display"], first["display"]);
+}
+
+TEST_F(LiveDataTest, WhatIsMaskedIsLeftOut) {
+    LiveData masked{{names, profile, recorded.resources, ReportHead()}};
+    const auto timeline = recorded.indexed();
+    masked.begin(timeline.get());
+    EXPECT_TRUE(masked.follow([] { return true; }));
+    EXPECT_EQ(jsonOf(masked.figures())["head"]["identities"], "left out");
+    const json sim = json::parse(*masked.state(Simulation::kStart + 1h, 0))["display"]["SIM Info"];
+    EXPECT_EQ(sim["EF-ICCID"], "left out");
+    EXPECT_EQ(sim["EF-MSISDN"], "left out");
+    EXPECT_EQ(sim["EF-LOCI"], "left out");
+    EXPECT_EQ(sim["EF-PLMN NETWORK NAME"], "Sample Net");
 }
 
 TEST_F(LiveDataTest, WherePacketsAreGoneTheFirstStateThatIsKeptIsShown) {
