@@ -34,9 +34,9 @@ The device of a recording is the name of its folder, unless --device names it.
 Values are those that the display shows at its ticks, every two seconds, and a
 level that was read more than 10 s ago is not known any more; --every packet
 keeps each value that was read, as the table "span" of pallax sql has it, in
-more than ten times the space. What identifies a person is left out, or replaced by
-pseudonyms (--pseudonyms; see pallax mask --help): with the same key, the same
-person is the same in all recordings.
+more than ten times the space. What identifies a person is left out, or replaced
+by pseudonyms (--pseudonyms; see pallax mask --help): with the same key, the
+same person is the same in all recordings.
 
 watch loads the recordings in FOLDER and in the folders in it, and then each one
 that appears there (.pcap and .pcapng, also .gz and .zst), when it is written or
