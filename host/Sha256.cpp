@@ -15,8 +15,8 @@ void require(bool isDone) {
 
 } // namespace
 
-void Sha256::Free::operator()(evp_md_ctx_st* state) const {
-    EVP_MD_CTX_free(state);
+void Sha256::Free::operator()(evp_md_ctx_st* context) const {
+    EVP_MD_CTX_free(context);
 }
 
 Sha256::Sha256() : _state(EVP_MD_CTX_new()) {

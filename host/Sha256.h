@@ -30,7 +30,7 @@ public:
 
 private:
     struct Free {
-        void operator()(evp_md_ctx_st* state) const;
+        void operator()(evp_md_ctx_st* context) const;
     };
 
     void begin();
