@@ -15,8 +15,10 @@ TEST(WebRequest, NamesOfHeadersHaveNoCase) {
 }
 
 TEST(WebRequest, FindsACookieAmongOthers) {
-    const auto cookie = [](const std::string& sent) {
-        return WebRequest{.method = "GET", .path = "/", .headers = {{"Cookie", sent}}}.cookie("b");
+    WebRequest request{.method = "GET", .path = "/"};
+    const auto cookie = [&request](const std::string& sent) {
+        request.headers = {{"Cookie", sent}};
+        return request.cookie("b");
     };
     EXPECT_EQ(cookie("b=2"), "2");
     EXPECT_EQ(cookie("a=1; b=2; c=3"), "2");
