@@ -16,7 +16,8 @@ constexpr double kMostLatitude = 90;
 constexpr double kMostLongitude = 180;
 constexpr int kDeepest = 8; ///< gpx, trk, trkseg, trkpt and any that a program puts around them
 
-/// "2023-11-14T22:13:20.250Z": a fraction of a second is dropped.
+/// "2023-11-14T22:13:20.250Z": a fraction of a second is dropped. Nothing for a time that no
+/// recording has; compared as seconds, because not every year can be one in nanoseconds.
 std::optional<Time> timeIn(std::string text) {
     const std::size_t point = text.find('.');
     if (point != std::string::npos) {
@@ -24,7 +25,8 @@ std::optional<Time> timeIn(std::string text) {
         text.erase(point, std::min(zone, text.size()) - point);
     }
     const auto date = parseIsoDate(text);
-    return date ? std::optional<Time>(*date) : std::nullopt;
+    const bool isInRange = date && *date >= dateOf(kEarliestTime) && *date <= dateOf(kLatestTime);
+    return isInRange ? std::optional<Time>(*date) : std::nullopt;
 }
 
 std::string_view localName(std::string_view name) {
@@ -41,8 +43,7 @@ void addPoint(const pugi::xml_node& node, Track& track) {
         if (!isPlace || localName(child.name()) != "time") {
             continue;
         }
-        const auto time = timeIn(child.text().get());
-        if (time && *time >= kEarliestTime && *time <= kLatestTime) {
+        if (const auto time = timeIn(child.text().get())) {
             point.time = *time;
             track.push_back(point);
             return;

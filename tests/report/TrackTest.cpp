@@ -36,6 +36,16 @@ TEST(Track, HasThePointsWithATimeInTheirOrder) {
     EXPECT_EQ((*track)[1].latitude, 50.5);
 }
 
+TEST(Track, LeavesOutTimesThatNoRecordingHas) {
+    const std::string place = R"(lat="50.5" lon="7.25")";
+    // Its nanoseconds would wrap round to a time in range.
+    EXPECT_EQ(parseTrack(bytesOf(gpx(point(place, "3313-11-14T22:13:22Z")))).error(),
+              "it has no points with a time");
+    EXPECT_EQ(parseTrack(bytesOf(gpx(point(place, "1969-12-31T23:59:59Z")))).error(),
+              "it has no points with a time");
+    EXPECT_EQ(parseTrack(bytesOf(gpx(point(place, "1970-01-01T00:00:00Z"))))->size(), 1U);
+}
+
 TEST(Track, RefusesWhatIsNone) {
     EXPECT_EQ(parseTrack(bytesOf("no xml")).error(), "it is no XML");
     EXPECT_EQ(parseTrack(bytesOf("<kml/>")).error(), "it is no GPX file");
