@@ -112,15 +112,17 @@ TEST_P(TimelineTablesTest, EveryTableOfASectionCanBeAsked) {
 TEST_P(TimelineTablesTest, ALabelIsThatOfItsRawNumber) {
     const bool hasRaw = _fixture.ask("select count(raw) from sample") != Lines{"0"};
     EXPECT_EQ(hasRaw, std::string(GetParam()) != "ifx");
-    EXPECT_EQ(_fixture.ask("select distinct s.field, s.raw, s.text, label(s.field, s.raw) from "
-                           "sample s join field f on f.name = s.field where s.raw is not null and "
+    // Each combination once: a join of all samples takes a minute under sanitizers.
+    const std::string samples =
+        "(select distinct field, raw, text, number from sample where raw is not null) s";
+    EXPECT_EQ(_fixture.ask("select s.field, s.raw, s.text, label(s.field, s.raw) from " + samples +
+                           " join field f on f.name = s.field where "
                            "label(s.field, s.raw) is not iif(f.kind = 'label', s.text, null) and "
                            "not (f.kind = 'number' and s.number is null)"),
               Lines{});
-    EXPECT_EQ(
-        _fixture.ask("select count(distinct s.field) > 2 from sample s join field f on f.name "
-                     "= s.field where f.kind = 'label' and s.raw is not null"),
-        Lines{hasRaw ? "1" : "0"});
+    EXPECT_EQ(_fixture.ask("select count(distinct s.field) > 2 from " + samples +
+                           " join field f on f.name = s.field where f.kind = 'label'"),
+              Lines{hasRaw ? "1" : "0"});
 }
 
 TEST_P(TimelineTablesTest, AllTablesAndColumnsAreListed) {
