@@ -25,14 +25,14 @@ and neighbours, lists events, and has the whole state at any time since then.
 A recording is played at its own pace; --speed max shows all of it at once. A
 recording with the name "demo" needs its folder (pallax web ./demo).
 
-The link holds a secret that is another one at each start; without it, nobody
-gets anything. Only programs of this machine can connect. From another machine,
+The link holds a secret, which is new at each start and without which nothing
+is served. Only programs of this machine can connect. From another machine,
 forward the port, which needs neither --listen nor a certificate:
 
   ssh -L 8080:127.0.0.1:8080 car pallax web --port 8080
 
---listen ADDRESS lets others of the network connect, who still need the link.
-Without --certificate and --key, they can read along on the way.
+--listen ADDRESS lets other machines connect; they still need the link. Without
+--certificate and --key, anyone on the network can read what is sent.
 
 What identifies a person, a device or a subscription is masked as it arrives,
 unless --with-identities is given.
@@ -83,7 +83,7 @@ void addListening(CLI::App& app, WebOptions& options) {
                }
                options.address = text;
            },
-           "Listen on this address of the machine, for others of the network (default: 127.0.0.1)")
+           "Listen on this address of the machine, for other machines (default: 127.0.0.1)")
         ->type_name("ADDRESS");
     CLI::Option* certificate =
         app.add_option("--certificate", options.certificate, "Encrypt with this certificate (PEM)")

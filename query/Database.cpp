@@ -191,8 +191,8 @@ Database::Database() : _authority(std::make_unique<Authority>()), _schemas{"main
 
 Database::Database(const std::string& file)
     : _authority(std::make_unique<Authority>()), _schemas{"main"} {
-    // SQLite takes no other name for a file, whatever it begins with.
-    // Only who may write a file tidies up after a writer that was killed; queries do not write.
+    // SQLite might take any other name for a URI or a temporary database. It is opened for writing,
+    // because only then can SQLite clean up after a writer that was killed; queries do not write.
     open(file.starts_with('/') ? file : "./" + file, SQLITE_OPEN_READWRITE);
     run(*_connection, "PRAGMA query_only = true");
     // Anybody may have made it.

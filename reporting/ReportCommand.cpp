@@ -25,7 +25,7 @@ namespace pallax {
 
 namespace {
 
-/// "drive.pcapng": without its folder, whose names are nobody's business.
+/// "drive.pcapng": without its folder, whose names may be private.
 std::string shownName(const PartPaths& paths) {
     if (paths.front() == "-") {
         return "standard input";

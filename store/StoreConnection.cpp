@@ -37,7 +37,7 @@ std::string sentenceOf(const std::string& file, sqlite3* connection, int code) {
     }
 }
 
-/// A name that SQLite takes for a file, whatever it begins with.
+/// The name of a file as SQLite needs it, so that it is not taken for a URI or an option.
 std::string fileName(const std::string& file) {
     return file.starts_with('/') ? file : "./" + file;
 }

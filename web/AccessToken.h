@@ -15,7 +15,7 @@ public:
     explicit AccessToken(std::string text) : _text(std::move(text)) {}
 
     const std::string& text() const { return _text; }
-    /// Takes the same time wherever the texts differ, so that nobody can guess digit by digit.
+    /// Takes the same time wherever the texts differ, so a token cannot be guessed digit by digit.
     bool is(std::string_view text) const;
 
 private:

@@ -173,7 +173,7 @@ void HttpServer::Impl::look() {
     runOnce();
 }
 
-/// Whoever connects most and asks least keeps nobody out.
+/// Idle connections cannot lock others out.
 void HttpServer::Impl::makeRoom() {
     if (clients.size() + setup.limits.spare <= setup.limits.connections) {
         return;

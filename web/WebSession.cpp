@@ -17,7 +17,7 @@ namespace {
 
 using Steady = std::chrono::steady_clock;
 
-/// Without the folders of a recording, whose names are nobody's business.
+/// Without the folders of a recording, whose names may be private.
 std::string shownName(const Source& source) {
     const auto recording = recordingPath(source);
     return recording && *recording != "-" ? std::filesystem::path(*recording).filename().string()

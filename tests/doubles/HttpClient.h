@@ -10,7 +10,7 @@
 
 namespace pallax::doubles {
 
-/// A client of a web server on this machine that sends what it is told, byte for byte.
+/// A client of a web server on this machine. It sends any bytes, valid or not.
 class HttpClient {
 public:
     /// Connects; `meanwhile` is called while the client waits, for a server in the same process.
