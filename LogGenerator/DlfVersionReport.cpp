@@ -1,5 +1,7 @@
 #include "LogGenerator/DlfVersionReport.h"
 
+#include "text/Bytes.h"
+
 #include <algorithm>
 
 namespace pallax {
@@ -21,7 +23,6 @@ constexpr std::size_t kDaylightOffset = 87;
 
 template <class Number>
 void putLittleEndian(std::span<std::uint8_t> record, std::size_t offset, Number number) {
-    constexpr unsigned kByteBits = 8;
     auto rest = static_cast<std::uint64_t>(number);
     for (std::size_t index = 0; index < sizeof(Number); ++index, rest >>= kByteBits) {
         record[offset + index] = static_cast<std::uint8_t>(rest);

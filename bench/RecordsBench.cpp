@@ -9,6 +9,7 @@
 #include "plist/PropertyListCodec.h"
 #include "tests/doubles/FakeStandardOutput.h"
 #include "tests/doubles/RecordBuilder.h"
+#include "text/Bytes.h"
 #include "text/Format.h"
 
 #include <benchmark/benchmark.h>
@@ -25,7 +26,6 @@ constexpr std::size_t kLength = 2048;
 
 /// Writes the number, or the largest that the position has bits for.
 void put(ByteBuffer& bytes, const Position& position, std::int64_t number) {
-    constexpr unsigned kByteBits = 8;
     const std::uint64_t largest = (std::uint64_t{1} << position.width) - 1;
     std::uint64_t bits = std::min(static_cast<std::uint64_t>(number), largest) << position.bit;
     for (std::size_t offset = position.byte; bits != 0; ++offset, bits >>= kByteBits) {

@@ -1,5 +1,6 @@
 #include "host/CapturePieces.h"
 
+#include "text/Bytes.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -18,7 +19,6 @@ using PieceKind = CapturePiece::Kind;
 
 constexpr std::size_t kMost = std::size_t{64} << 20U; // bytes of a piece
 constexpr std::size_t kNumber = 4;
-constexpr unsigned kByteBits = 8;
 
 constexpr std::size_t kPcapHeader = 24;
 constexpr std::size_t kLinkTypeAt = 20;

@@ -1,6 +1,7 @@
 #include "host/EmbeddedDigests.h"
 
 #include "host/CapturePieces.h"
+#include "text/Bytes.h"
 
 #include <algorithm>
 #include <string_view>
@@ -18,21 +19,20 @@ constexpr std::size_t kLastAt = kBodyAt + 20;
 constexpr std::size_t kDigestAt = kBodyAt + 24;
 constexpr std::size_t kTrailerAt = kDigestAt + sizeof(Sha256::Digest);
 constexpr std::size_t kWordSize = 4;
-constexpr unsigned kBitsOfByte = 8;
 
 static_assert(kTrailerAt + kWordSize == EmbeddedDigests::kBlockSize);
 
 void put(ByteBuffer& bytes, std::uint64_t number, std::size_t width, bool isBigEndian = false) {
     for (std::size_t index = 0; index < width; ++index) {
         const std::size_t place = isBigEndian ? width - 1 - index : index;
-        bytes.push_back(static_cast<std::uint8_t>(number >> (place * kBitsOfByte)));
+        bytes.push_back(static_cast<std::uint8_t>(number >> (place * kByteBits)));
     }
 }
 
 std::uint64_t numberIn(Bytes bytes, std::size_t at, std::size_t width) {
     std::uint64_t number = 0;
     for (std::size_t index = width; index > 0; --index) {
-        number = number << kBitsOfByte | bytes[at + index - 1];
+        number = number << kByteBits | bytes[at + index - 1];
     }
     return number;
 }

@@ -1,5 +1,6 @@
 #include "host/RecordingWriter.h"
 
+#include "text/Bytes.h"
 #include "text/Format.h"
 
 #include <array>
@@ -16,7 +17,6 @@ namespace {
 template <std::size_t kCount>
 void append(ByteBuffer& out, const std::array<std::uint32_t, kCount>& numbers) {
     constexpr unsigned kNumberBits = 32;
-    constexpr unsigned kByteBits = 8;
     std::array<std::uint8_t, kCount * sizeof(std::uint32_t)> bytes{};
     auto place = bytes.begin();
     for (const std::uint32_t number : numbers) {

@@ -1,9 +1,10 @@
 #include "masking/BitField.h"
 
+#include "text/Bytes.h"
+
 namespace pallax {
 
 void writeNumber(std::span<std::uint8_t> record, const Position& position, std::uint64_t number) {
-    constexpr unsigned kByteBits = 8;
     const std::size_t last = (position.bit + position.width - 1) / kByteBits;
     for (unsigned index = 0; index < position.width; ++index) {
         const unsigned bit = position.bit + index;

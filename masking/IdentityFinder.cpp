@@ -1,6 +1,7 @@
 #include "masking/IdentityFinder.h"
 
 #include "knowledge/CountryCodes.h"
+#include "masking/BitField.h"
 
 #include <algorithm>
 #include <array>
@@ -151,8 +152,6 @@ void findLetters(Bytes bytes, std::size_t stride, std::vector<FoundIdentity>& fo
     }
 }
 
-constexpr unsigned kHalfBits = 4;
-constexpr std::uint8_t kHalf = 0xF;
 constexpr std::uint8_t kLastDigit = 9;
 
 /// The digits in halves of bytes, the low half first if `isSwapped`, up to something else; a filler

@@ -1,9 +1,11 @@
 #include "masking/ListMask.h"
 
+#include "masking/BitField.h"
 #include "masking/IdentityFinder.h"
 #include "masking/Permutation.h"
 #include "plist/PropertyListCodec.h"
 #include "text/Base64.h"
+#include "text/Bytes.h"
 #include "text/Date.h"
 
 #include <algorithm>
@@ -17,10 +19,8 @@ namespace pallax {
 namespace {
 
 using Type = PropertyList::Type;
-using Coding = ScalarPlace::Coding;
 
 constexpr std::string_view kNoDate = "2001-01-01T00:00:00Z";
-constexpr unsigned kByteBits = 8;
 
 Bytes bytesOf(std::string_view text) {
     return {reinterpret_cast<const std::uint8_t*>(text.data()), text.size()}; // NOLINT
@@ -86,15 +86,15 @@ public:
         }
         const ByteBuffer from = canonical(value);
         switch (place.coding) {
-        case Coding::Letters:
+        case ScalarPlace::Coding::Letters:
             return put(content, lettersFor(place.type, from, content.size()));
-        case Coding::Utf16:
+        case ScalarPlace::Coding::Utf16:
             return putUtf16(content, _replacement.letters(from, content.size() / 2));
-        case Coding::Base64:
+        case ScalarPlace::Coding::Base64:
             return putBase64(content, value.data(), from);
-        case Coding::Hex:
+        case ScalarPlace::Coding::Hex:
             return putHex(content, from);
-        case Coding::Raw:
+        case ScalarPlace::Coding::Raw:
             return putRaw(place.type, content, from);
         }
     }
@@ -158,8 +158,6 @@ private:
 
     void putHex(std::span<std::uint8_t> content, const ByteBuffer& from) const {
         constexpr std::string_view kDigits = "0123456789abcdef";
-        constexpr unsigned kHalfBits = 4;
-        constexpr unsigned kHalf = 0xF;
         const ByteBuffer bytes = _replacement.bytes(from, from.size());
         std::size_t half = 0;
         for (std::uint8_t& letter : content) {
@@ -199,13 +197,13 @@ private:
 
     void replacePlace(const ScalarPlace& place, std::span<std::uint8_t> content) const {
         const Permutation permutation(_places);
-        if (place.coding == Coding::Letters) {
+        if (place.coding == ScalarPlace::Coding::Letters) {
             const std::string text(content.begin(), content.end());
             const bool isEscaped = text.find_first_of("&<\\") != std::string::npos;
             return put(content, isEscaped ? _places.letters(bytesOf(text), text.size())
                                           : withOtherPlaces(text, permutation));
         }
-        if (place.coding == Coding::Utf16) {
+        if (place.coding == ScalarPlace::Coding::Utf16) {
             return replaceUtf16Place(content, permutation);
         }
         if (place.type != Type::kInteger || content.size() > sizeof(std::uint64_t)) {

@@ -7,6 +7,7 @@
 #include "masking/IdentityFinder.h"
 #include "masking/ListMask.h"
 #include "masking/Permutation.h"
+#include "text/Bytes.h"
 
 #include <algorithm>
 #include <span>
@@ -14,8 +15,6 @@
 namespace pallax {
 
 namespace {
-
-constexpr unsigned kByteBits = 8;
 
 /// A place of a record that is to be replaced.
 struct Edit {

@@ -1,5 +1,8 @@
 #include "masking/Permutation.h"
 
+#include "masking/BitField.h"
+#include "text/Bytes.h"
+
 #include <algorithm>
 #include <array>
 #include <bit>
@@ -21,7 +24,6 @@ std::uint64_t lowBits(unsigned width) {
 /// A Feistel network over two parts of nearly the same width: a permutation whatever the function.
 std::uint64_t Permutation::once(std::uint64_t number, unsigned width) const {
     constexpr unsigned kRounds = 10;
-    constexpr unsigned kByteBits = 8;
     unsigned lowWidth = width / 2;
     for (unsigned round = 0; round < kRounds; ++round) {
         const unsigned highWidth = width - lowWidth;

@@ -1,5 +1,7 @@
 #include "masking/Replacement.h"
 
+#include "masking/BitField.h"
+
 #include <algorithm>
 #include <array>
 #include <openssl/evp.h>
@@ -10,9 +12,6 @@ namespace pallax {
 
 namespace {
 
-constexpr unsigned kByteBits = 8;
-constexpr unsigned kHalfBits = 4;
-constexpr unsigned kHalf = 0xF;
 constexpr unsigned kDigits = 10;      ///< values of a half that are decimal digits
 constexpr unsigned kMarkedWidth = 24; ///< the narrowest number that is marked
 constexpr std::uint64_t kMark = 0xFF;

@@ -1,6 +1,7 @@
 #include "overview/ValueFacts.h"
 
 #include "fields/Measures.h"
+#include "text/Bytes.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -40,7 +41,6 @@ std::string rawText(std::int64_t raw, const Conversion& shownAs) {
 
 /// "bits 0-8 of bytes 21-22".
 std::string placeText(const Position& position) {
-    constexpr unsigned kByteBits = 8;
     const auto span = [](std::string_view one, std::string_view several, std::size_t first,
                          std::size_t last) {
         return first == last ? formatText("%@ %@", {one, first})

@@ -2,6 +2,7 @@
 #include "plist/Refusal.h"
 #include "plist/ScalarPlaces.h"
 #include "text/ByteReader.h"
+#include "text/Bytes.h"
 
 #include <algorithm>
 #include <string_view>
@@ -177,7 +178,6 @@ private:
     }
 
     static void appendNumber(ByteBuffer& list, std::uint64_t number, std::size_t width) {
-        constexpr unsigned kByteBits = 8;
         for (std::size_t left = width; left > 0; --left) {
             list.push_back(static_cast<std::uint8_t>(number >> ((left - 1) * kByteBits)));
         }

@@ -1,6 +1,7 @@
 #include "reference/Phrases.h"
 
 #include "platform/TelephonyConstants.h"
+#include "text/Bytes.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -13,7 +14,6 @@ namespace pallax {
 
 namespace {
 
-constexpr unsigned kByteBits = 8;
 constexpr std::int64_t kLargestByte = 255;
 /// The common prefix of the radio access technologies' constants.
 constexpr std::string_view kRadioAccessTechnology = "kHXCellMonitorRadioAccessTechnology";

@@ -1,5 +1,7 @@
 #include "text/Base64.h"
 
+#include "text/Bytes.h"
+
 #include <array>
 #include <cstdint>
 
@@ -11,7 +13,6 @@ constexpr std::string_view kAlphabet =
     "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
 constexpr std::uint8_t kNoDigit = 0xFF;
 constexpr unsigned kDigitBits = 6;
-constexpr unsigned kByteBits = 8;
 
 constexpr std::array<std::uint8_t, 256> kDigits = [] {
     std::array<std::uint8_t, 256> digits{};

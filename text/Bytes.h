@@ -16,4 +16,6 @@ using ByteBuffer = std::vector<std::uint8_t>;
 /// Immutable bytes shared by several owners (a property list's data value).
 using SharedBytes = std::shared_ptr<const ByteBuffer>;
 
+constexpr unsigned kByteBits = 8;
+
 } // namespace pallax

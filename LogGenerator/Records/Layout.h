@@ -6,6 +6,7 @@
 #include "LogGenerator/Records/LogRecord.h"
 #include "platform/SystemLog.h"
 #include "plist/PropertyList.h"
+#include "text/Bytes.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -40,7 +41,6 @@ struct Extent {
 
 /// The bytes that contain a position.
 constexpr Extent extentOf(const Position& position, Extent::Origin origin = Extent::Origin::Here) {
-    constexpr unsigned kByteBits = 8;
     return {position.byte, (position.bit + position.width + kByteBits - 1) / kByteBits, origin};
 }
 

@@ -102,8 +102,6 @@ public:
     }
 
 private:
-    static constexpr unsigned kByteBits = 8;
-
     /// The bytes from `position.byte` on as one number; the caller drops the high bits. If 8 bytes
     /// are available, they are loaded at once.
     std::uint64_t gather(const Position& position) const {

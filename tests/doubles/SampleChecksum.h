@@ -1,6 +1,7 @@
 #pragma once
 
 #include "LogGenerator/Records/Sample.h"
+#include "text/Bytes.h"
 
 #include <array>
 #include <bit>
@@ -32,7 +33,6 @@ public:
     }
     static std::uint64_t of(double number) { return std::bit_cast<std::uint64_t>(number); }
     static std::uint64_t of(std::string_view text) {
-        constexpr unsigned kByteBits = 8;
         std::uint64_t word = 0;
         if (text.size() < sizeof(word)) {
             for (const char character : text) {
