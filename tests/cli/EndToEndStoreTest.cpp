@@ -162,7 +162,7 @@ TEST_F(EndToEndStore, AnswersQuestions) {
     EXPECT_EQ(ask({"recordings"}),
               "device,name,technology,first,last,packets,every,identities,decoder,trouble\n"
               "car1,lte-drive.pcap,lte,2023-11-14T22:13:20.036Z,2023-11-14T22:15:19.958Z,1200,tick,"
-              "left out,0.1.0,\n");
+              "left out,0.2.0,\n");
 }
 
 TEST_F(EndToEndStore, QueriesOfRecordingsRunUnchanged) {

@@ -48,7 +48,7 @@ TEST_F(EndToEndVerify, TellsThatARecordingIsWhatItWas) {
     EXPECT_EQ(run({"verify", "--update", file}).status, 0);
     const Run same = run({"verify", file});
     EXPECT_EQ(same.status, 0);
-    EXPECT_EQ(same.out, file + ": 51 packets, as with version 0.1.0\n");
+    EXPECT_EQ(same.out, file + ": 51 packets, as with version 0.2.0\n");
 }
 
 TEST_F(EndToEndVerify, TellsThatItIsNot) {
