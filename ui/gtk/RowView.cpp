@@ -22,11 +22,10 @@ void setClass(GtkWidget* widget, const char* name, bool isSet) {
     }
 }
 
-GtkLabel* smallLabel(GtkBox* box) {
+GtkLabel* dimLabel() {
     GtkWidget* label = gtk_label_new(nullptr);
     gtk_widget_add_css_class(label, "dim-label");
     gtk_widget_set_visible(label, FALSE);
-    gtk_box_append(box, label);
     return GTK_LABEL(label);
 }
 
@@ -75,13 +74,20 @@ RowView::RowView(const PangoMetrics& metrics, const Guard& guard,
     gtk_widget_set_hexpand(scroller, TRUE);
     gtk_widget_set_can_focus(scroller, FALSE);
     gtk_box_append(_box.get(), scroller);
-    _age = smallLabel(_box.get());
-    _count = smallLabel(_box.get());
+    GtkWidget* side = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, kAccessoryMargin);
+    gtk_widget_set_hexpand(side, FALSE); // the room is the content's
+    _side = GTK_BOX(side);
+    gtk_box_append(_box.get(), side);
+    _count = dimLabel();
+    gtk_widget_set_hexpand(GTK_WIDGET(_count), TRUE);
+    gtk_label_set_xalign(_count, 1);
+    gtk_box_append(_side, GTK_WIDGET(_count));
     _accessory = GTK_IMAGE(gtk_image_new());
     gtk_widget_add_css_class(GTK_WIDGET(_accessory), "dim-label");
-    gtk_widget_set_margin_start(GTK_WIDGET(_accessory), kAccessoryMargin);
     gtk_widget_set_margin_end(GTK_WIDGET(_accessory), kAccessoryMargin);
-    gtk_box_append(_box.get(), GTK_WIDGET(_accessory));
+    gtk_box_append(_side, GTK_WIDGET(_accessory));
+    _age = dimLabel();
+    gtk_fixed_put(_content, GTK_WIDGET(_age), 0, 0);
     replaceWheel(scroller);
     listen(guard, std::move(scrolled));
 }
@@ -156,13 +162,14 @@ void RowView::fill(const ui::TableCell& cell, const RowNotes& notes) {
                                 isWider ? _metrics.pixels(container->contentSize.width) : 0,
                                 _metrics.pixels(kRowHeight));
     gtk_widget_set_size_request(widget(), -1, _metrics.pixels(kRowHeight));
+    gtk_widget_set_size_request(GTK_WIDGET(_side), _metrics.pixels(kAccessoryWidth), -1);
     showNotes(cell, notes);
+    showAge(contents, notes.age);
     gtk_accessible_update_property(GTK_ACCESSIBLE(widget()), GTK_ACCESSIBLE_PROPERTY_LABEL,
                                    spokenName(contents, notes).c_str(), -1);
 }
 
 void RowView::showNotes(const ui::TableCell& cell, const RowNotes& notes) {
-    showText(_age, notes.age);
     showText(_count, notes.count);
     const ui::CellAccessory accessory = cell.accessory();
     const char* icon = accessory == ui::CellAccessory::DisclosureIndicator ? "go-next-symbolic"
@@ -175,6 +182,23 @@ void RowView::showNotes(const ui::TableCell& cell, const RowNotes& notes) {
         setClass(GTK_WIDGET(_labels[index]), "dim-label", !notes.age.empty() && index == last);
     }
     setClass(widget(), kOpenClass, notes.isOpen);
+}
+
+/// Between name and value, if there is room.
+void RowView::showAge(const ui::CellContents& contents, const std::string& age) {
+    constexpr double kMargin = 10;
+    constexpr ui::Font kFont{ui::FontFace::System, 12};
+    const ui::Size extent = _metrics.measure(age, kFont);
+    const ui::Rect& name = contents.labels.front()->frame;
+    const ui::Rect& value = contents.labels.back()->frame;
+    const double x = value.origin.x - kMargin - extent.width;
+    const bool hasRoom =
+        contents.labels.size() > 1 && x >= name.origin.x + name.size.width + kMargin;
+    showText(_age, hasRoom ? age : "");
+    const auto attributes = _metrics.attributes(kFont);
+    gtk_label_set_attributes(_age, attributes.get());
+    gtk_fixed_move(_content, GTK_WIDGET(_age), std::round(x * _metrics.scale()),
+                   std::round((kRowHeight - extent.height) / 2 * _metrics.scale()));
 }
 
 double RowView::offset() const {

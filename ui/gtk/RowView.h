@@ -48,6 +48,7 @@ private:
     /// `area` is that of a cell that does not scroll.
     void place(GtkLabel* label, const ui::Label& content, const ui::Rect& area, bool isBold);
     void showNotes(const ui::TableCell& cell, const RowNotes& notes);
+    void showAge(const ui::CellContents& contents, const std::string& age);
     void listen(const Guard& guard, std::function<void(double)> scrolled);
 
     const PangoMetrics& _metrics;
@@ -55,6 +56,7 @@ private:
     GtkScrolledWindow* _scroller; // the box owns it and what follows
     GtkFixed* _content;
     std::vector<GtkLabel*> _labels;
+    GtkBox* _side; ///< right of the content area
     GtkLabel* _age;
     GtkLabel* _count;
     GtkImage* _accessory;
