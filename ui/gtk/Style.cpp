@@ -13,6 +13,12 @@ constexpr const char* kStyle = R"(
 .pallax-rows { background: none; }
 .pallax-rows > row { padding: 0; margin: 0; border-radius: 0; }
 .pallax-rows label { padding: 0; }
+.pallax-rows undershoot.right {
+    background: linear-gradient(to left, alpha(@window_fg_color, 0.3), transparent 14px);
+}
+.pallax-rows undershoot.left {
+    background: linear-gradient(to right, alpha(@window_fg_color, 0.3), transparent 14px);
+}
 .pallax-changed { color: @accent_color; }
 .pallax-open { background: alpha(@accent_bg_color, 0.2); }
 .pallax-toolbar { border-top: 1px solid @borders; min-height: 34px; padding: 4px 10px; }
