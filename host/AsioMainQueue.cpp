@@ -125,6 +125,21 @@ bool AsioMainQueue::runReady() {
     return !isStopped;
 }
 
+bool AsioMainQueue::runTurn(std::optional<std::chrono::nanoseconds> longest) {
+    constexpr std::chrono::milliseconds kTurn{8}; // half a frame of a usual screen
+    if (longest) {
+        _impl->context.run_one_for(steadyDuration(*longest));
+    } else {
+        _impl->context.run_one();
+    }
+    const auto end = std::chrono::steady_clock::now() + kTurn;
+    while (std::chrono::steady_clock::now() < end && _impl->context.poll_one() != 0) {
+    }
+    const bool isStopped = _impl->context.stopped();
+    _impl->context.restart();
+    return !isStopped;
+}
+
 void AsioMainQueue::stop() {
     _impl->context.stop();
 }

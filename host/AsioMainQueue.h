@@ -8,11 +8,12 @@
 #include <functional>
 #include <initializer_list>
 #include <memory>
+#include <optional>
 
 namespace pallax {
 
 /// The main queue, its timers and its loop, on Asio. Blocks, timers, signals and descriptor watches
-/// all run inside `run` or `runReady`; only `async` may be called from another thread.
+/// all run inside `run`, `runReady` or `runTurn`; only `async` may be called from another thread.
 class AsioMainQueue final : public MainQueue, public TimerScheduler, public RunLoop {
 public:
     AsioMainQueue();
@@ -29,6 +30,11 @@ public:
     void run() override;
     bool runReady() override;
     void stop() override;
+    /// For a loop that takes turns with another one on the same thread: waits for a block, at most
+    /// `longest` (nothing: until one comes), then runs what is ready, but only for some
+    /// milliseconds, so that the other loop gets its turn under any load. False once after `stop`.
+    /// An exception leaves as from `run`.
+    bool runTurn(std::optional<std::chrono::nanoseconds> longest);
 
     /// Calls `action` as a block for each of these signals, instead of their default action. A
     /// later call replaces an earlier one.

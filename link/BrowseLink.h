@@ -38,6 +38,7 @@ public:
 
     AsioMainQueue& queue() { return _queue; }
     SourceClock& clock() { return _clock; }
+    const SourceClock& clock() const { return _clock; }
     const Clock& present() const { return _wallClock; }
     const Resources& resources() const { return _resources; }
     const Bundle& bundle() const { return _bundle; }

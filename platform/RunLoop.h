@@ -5,9 +5,9 @@ namespace pallax {
 /// What runs the blocks of the main queue, and all that is told through it: timers, messages,
 /// signals. Everything runs on the thread that calls `run` or `runReady`.
 ///
-/// A program without another loop calls `run`. Under a toolkit that has a loop of its own, that
-/// loop calls `runReady` instead, from a timer of its own, until it returns false; a block waits
-/// until the next call at the latest, so some ten milliseconds are a good interval.
+/// A program without another loop calls `run`. Under a loop that only has timers, `runReady` is
+/// called from one of them until it returns false; a block waits until the next call at the latest,
+/// so some ten milliseconds are a good interval.
 class RunLoop {
 public:
     virtual ~RunLoop() = default;

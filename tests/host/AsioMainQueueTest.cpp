@@ -68,6 +68,49 @@ TEST(AsioMainQueue, ALoopThatIsNotItsOwnRunsWhatIsReadyUntilItIsStopped) {
     EXPECT_FALSE(loop.runReady());
 }
 
+TEST(AsioMainQueue, ATurnWaitsForABlockAndRunsWhatIsReady) {
+    AsioMainQueue queue;
+    std::vector<int> order;
+    queue.after(5ms, [&] {
+        order.push_back(1);
+        queue.async([&] { order.push_back(2); });
+    });
+    EXPECT_TRUE(queue.runTurn(std::nullopt));
+    EXPECT_EQ(order, (std::vector<int>{1, 2}));
+}
+
+TEST(AsioMainQueue, ATurnEndsWhenNothingHasComeInItsTime) {
+    AsioMainQueue queue;
+    bool ran = false;
+    queue.after(10min, [&] { ran = true; });
+    EXPECT_TRUE(queue.runTurn(1ms));
+    EXPECT_FALSE(ran);
+}
+
+TEST(AsioMainQueue, ATurnEndsAlthoughBlocksGoOnPostingBlocks) {
+    AsioMainQueue queue;
+    std::function<void()> again = [&] { queue.async(again); };
+    again();
+    EXPECT_TRUE(queue.runTurn(0ms));
+}
+
+TEST(AsioMainQueue, AStopEndsTheTurnsOnce) {
+    AsioMainQueue queue;
+    queue.async([&] { queue.stop(); });
+    EXPECT_FALSE(queue.runTurn(std::nullopt));
+    EXPECT_TRUE(queue.runTurn(0ms));
+}
+
+TEST(AsioMainQueue, AnExceptionLeavesATurnAndTheNextGoesOn) {
+    AsioMainQueue queue;
+    bool ran = false;
+    queue.async([] { throw std::runtime_error("broken"); });
+    queue.async([&] { ran = true; });
+    EXPECT_THROW(queue.runTurn(std::nullopt), std::runtime_error);
+    EXPECT_TRUE(queue.runTurn(0ms));
+    EXPECT_TRUE(ran);
+}
+
 TEST(AsioMainQueue, TimersRunUnderALoopThatIsNotItsOwn) {
     AsioMainQueue queue;
     RunLoop& loop = queue;

@@ -26,6 +26,12 @@ std::vector<std::string> linesOf(const std::string& text) {
 
 } // namespace
 
+TimeControl::TimeControl(Surroundings surroundings) : _surroundings(std::move(surroundings)) {
+    if (travel() != nullptr) {
+        _panes.emplace(*travel(), _surroundings.toolkit);
+    }
+}
+
 bool TimeControl::handle(const KeyEvent& event) {
     if (travel() == nullptr) {
         return false;
@@ -120,8 +126,9 @@ void TimeControl::handleTyping(const KeyEvent& event) {
 
 void TimeControl::forget() {
     _typed.reset();
-    _panes.reset();
-    _walk.reset();
+    if (_panes) {
+        _panes->forget();
+    }
     _compared.reset();
     _changes = {};
 }
@@ -131,26 +138,7 @@ std::optional<Prompt> TimeControl::prompt() const {
 }
 
 TerminalNavigation* TimeControl::panes(const TerminalNavigation& live) {
-    if (!isAway()) {
-        _panes.reset();
-        _walk.reset();
-        return nullptr;
-    }
-    const Moment moment = travel()->moment();
-    if (_panes == nullptr) {
-        _panes = std::make_unique<HeldPanes>(_surroundings.toolkit, live);
-        _paneInstant = moment.instant + 1;
-    }
-    if (_paneInstant != moment.instant && moment.timeline != nullptr) {
-        _paneInstant = moment.instant;
-        if (!_walk || _walked != moment.timeline) {
-            _walked = moment.timeline;
-            _walk.emplace(*moment.timeline);
-        }
-        const auto frame = _walk->at(moment.instant);
-        _panes->show(frame ? frame->frame : nullptr, frame ? frame->before : nullptr);
-    }
-    return &static_cast<TerminalNavigation&>(_panes->stack());
+    return _panes ? static_cast<TerminalNavigation*>(_panes->shown(live)) : nullptr;
 }
 
 std::optional<TimeBar> TimeControl::bar() const {

@@ -1,7 +1,6 @@
 #pragma once
 
-#include "app/HeldPanes.h"
-#include "timeline/FrameWalk.h"
+#include "travel/InstantPanes.h"
 #include "travel/Travel.h"
 #include "ui/drawing/Bars.h"
 #include "ui/drawing/LineEditor.h"
@@ -10,7 +9,6 @@
 
 #include <cstdint>
 #include <functional>
-#include <memory>
 #include <optional>
 #include <string>
 
@@ -27,7 +25,7 @@ public:
         std::function<void()> needsDisplay;
     };
 
-    explicit TimeControl(Surroundings surroundings) : _surroundings(std::move(surroundings)) {}
+    explicit TimeControl(Surroundings surroundings);
 
     /// Handles its keys and, while a place to go to is typed, all; false for any other key.
     bool handle(const KeyEvent& event);
@@ -59,10 +57,7 @@ private:
 
     Surroundings _surroundings;
     std::optional<LineEditor> _typed;
-    std::unique_ptr<HeldPanes> _panes;
-    std::uint64_t _paneInstant = 0; ///< that the panes show
-    std::optional<FrameWalk> _walk; ///< while another instant than the present is shown
-    const Timeline* _walked = nullptr;
+    std::optional<InstantPanes> _panes; ///< nothing if there is only the present
     ChangesPage::Content _changes;
     std::optional<std::pair<std::uint64_t, std::uint64_t>> _compared; ///< whose changes are known
 };

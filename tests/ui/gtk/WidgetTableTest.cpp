@@ -1,0 +1,130 @@
+#include "tests/ui/gtk/WindowStage.h"
+#include "tests/ui/gtk/XDisplay.h"
+
+#include <string>
+
+namespace pallax::gtk {
+namespace {
+
+class WidgetTableRows : public DisplayTest {
+protected:
+    /// "Row 0" to the last, with values.
+    static Dictionary rows(int count, const std::string& value = "1") {
+        Dictionary made;
+        for (int row = 0; row < count; ++row) {
+            made.set("Row " + std::to_string(row), value.c_str());
+        }
+        return made;
+    }
+    static GtkAdjustment* place(WindowStage& stage) {
+        return gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(
+            WindowStage::below(stage.table().widget(), GTK_TYPE_SCROLLED_WINDOW)));
+    }
+    /// The sideways place of the first row.
+    static GtkAdjustment* sideways(WindowStage& stage) {
+        GtkWidget* list = WindowStage::below(stage.table().widget(), GTK_TYPE_LIST_VIEW);
+        return gtk_scrolled_window_get_hadjustment(
+            GTK_SCROLLED_WINDOW(WindowStage::below(list, GTK_TYPE_SCROLLED_WINDOW)));
+    }
+    static GtkWidget* rowWidget(WindowStage& stage, int index) {
+        GtkWidget* row = gtk_widget_get_first_child(
+            WindowStage::below(stage.table().widget(), GTK_TYPE_LIST_VIEW));
+        for (; index > 0; --index) {
+            row = gtk_widget_get_next_sibling(row);
+        }
+        return row;
+    }
+    static std::string nameOf(GtkWidget* row) {
+        return gtk_label_get_text(GTK_LABEL(WindowStage::found(row, [](GtkWidget* widget) {
+            return GTK_IS_LABEL(widget) && *gtk_label_get_text(GTK_LABEL(widget)) != '\0';
+        })));
+    }
+};
+
+TEST_F(WidgetTableRows, ThePlaceInTheListStaysAcrossTicks) {
+    WindowStage stage(360, 400);
+    stage.tick(rows(50));
+    gtk_adjustment_set_value(place(stage), 600);
+    stage.settle();
+    stage.tick(rows(50, "2"));
+    EXPECT_EQ(gtk_adjustment_get_value(place(stage)), 600);
+    EXPECT_NE(stage.dump().find("Row 13 (at 10) | 2 (flush right)"), std::string::npos)
+        << stage.dump();
+}
+
+TEST_F(WidgetTableRows, RowsThatComeIntoViewShowTheLatestValues) {
+    WindowStage stage(360, 400);
+    stage.tick(rows(50));
+    stage.tick(rows(50, "2"));
+    gtk_adjustment_set_value(place(stage), 2000);
+    stage.settle();
+    EXPECT_EQ(stage.dump().find("| 1 ("), std::string::npos) << stage.dump();
+    EXPECT_NE(stage.dump().find("| 2 ("), std::string::npos);
+}
+
+TEST_F(WidgetTableRows, ASidewaysOffsetStaysWithItsRowAcrossTicks) {
+    WindowStage stage(360, 400);
+    const std::string value(60, 'w');
+    stage.tick(Dictionary{{"Name", value.c_str()}});
+    gtk_adjustment_set_value(sideways(stage), 80);
+    stage.tick(Dictionary{{"Name", value.c_str()}});
+    EXPECT_NE(stage.dump().find("(50 behind), scrolled by 80"), std::string::npos) << stage.dump();
+    stage.tick(Dictionary{{"New", "1"}, {"Name", value.c_str()}});
+    EXPECT_NE(stage.dump().find("row: New (at 10) | 1 (flush right)\n"), std::string::npos);
+    EXPECT_NE(stage.dump().find("(50 behind), scrolled by 80"), std::string::npos) << stage.dump();
+}
+
+TEST_F(WidgetTableRows, TheFocusStaysOnItsRowWhenAnotherComesAboveIt) {
+    WindowStage stage(360, 400);
+    stage.tick(Dictionary{{"A", "1"}, {"B", "1"}});
+    gtk_widget_grab_focus(rowWidget(stage, 1));
+    stage.tick(Dictionary{{"New", "1"}, {"A", "1"}, {"B", "1"}});
+    GtkWidget* focus = gtk_window_get_focus(stage.frame.window());
+    ASSERT_NE(focus, nullptr);
+    EXPECT_EQ(nameOf(focus), "B");
+}
+
+TEST_F(WidgetTableRows, WhatHasChangedIsMarkedForOneTick) {
+    WindowStage stage(360, 400);
+    stage.tick(Dictionary{{"A", "1"}});
+    stage.tick(Dictionary{{"A", "2"}});
+    const auto isMarked = [&] {
+        return WindowStage::found(rowWidget(stage, 0), [](GtkWidget* widget) {
+                   return gtk_widget_has_css_class(widget, "pallax-changed") != FALSE;
+               }) != nullptr;
+    };
+    EXPECT_TRUE(isMarked());
+    stage.tick(Dictionary{{"A", "2"}});
+    EXPECT_FALSE(isMarked());
+}
+
+TEST_F(WidgetTableRows, ScreenReadersHearNameAndValue) {
+    WindowStage stage(360, 400);
+    stage.tick(Dictionary{{"RSRP", "1"}, {"List", Array{Dictionary{}, Dictionary{}}}});
+    stage.tick(Dictionary{{"RSRP", "-94.75 dBm"}, {"List", Array{Dictionary{}, Dictionary{}}}});
+    const auto hears = [&](int row, const char* words) {
+        char* fault = gtk_test_accessible_check_property(
+            GTK_ACCESSIBLE(gtk_widget_get_first_child(rowWidget(stage, row))),
+            GTK_ACCESSIBLE_PROPERTY_LABEL, words);
+        EXPECT_EQ(fault, nullptr) << fault;
+        g_free(fault);
+    };
+    hears(0, "RSRP: -94.75 dBm, changed");
+    hears(1, "List, 2");
+}
+
+TEST_F(WidgetTableRows, OnlyRowsInViewAreAskedFor) {
+    WindowStage stage(360, 400);
+    stage.tick(rows(1000));
+    // Rows that nobody asked for at the tick of a change do not know of it.
+    stage.tick(rows(1000, "2"));
+    EXPECT_TRUE(stage.table().pane().row(2).hasChanged);
+    int asked = 0;
+    for (std::size_t row = 0; row < 1000; ++row) {
+        asked += stage.table().pane().row(row).changedAt ? 1 : 0;
+    }
+    EXPECT_LT(asked, 300);
+}
+
+} // namespace
+} // namespace pallax::gtk

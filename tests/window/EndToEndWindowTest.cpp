@@ -1,0 +1,144 @@
+#include "tests/cli/EndToEnd.h"
+#include "tests/doubles/Shell.h"
+#include "tests/ui/gtk/XServer.h"
+
+#include <filesystem>
+#include <fstream>
+
+namespace pallax {
+namespace {
+
+using doubles::CommandRun;
+using doubles::isInstalled;
+using doubles::runCommand;
+using std::chrono::milliseconds;
+using std::chrono::seconds;
+
+/// The real program in an X server and on a session bus of its own, driven as a screen reader does.
+class EndToEndWindow : public EndToEnd {
+protected:
+    void SetUp() override {
+        if (_server.display().empty() || !isInstalled("dbus-run-session") ||
+            runCommand("/usr/bin/python3 -c 'import gi; gi.require_version(\"Atspi\", \"2.0\")'")
+                    .status != 0) {
+            GTEST_SKIP() << "Xvfb, dbus-run-session or python3-gi with Atspi is not installed";
+        }
+        world.environment = {"DISPLAY=" + _server.display(), "GDK_BACKEND=x11",
+                             "GSK_RENDERER=cairo",           "GSETTINGS_BACKEND=memory",
+                             "ADW_DISABLE_PORTAL=1",         "PATH=/usr/bin:/bin",
+                             "HOME=" + world.path()};
+    }
+
+    /// Snapshots can be saved into this folder, which is the marker, too.
+    std::string offerSaving(const std::string& folder) const {
+        std::filesystem::create_directories(world.path("config/pallax"));
+        std::filesystem::create_directories(world.path("marker"));
+        std::ofstream(world.path("config/pallax/pallax.conf"))
+            << "snapshot-directory = " << folder
+            << "\nsave-button-marker = " << world.path("marker") << "\n";
+        return folder;
+    }
+
+    /// Starts the program with the arguments, takes the steps of drive.py, and ends the program
+    /// with SIGTERM unless the steps end it. The status is the program's; the text is what both
+    /// wrote.
+    CommandRun drive(const std::string& arguments, const std::string& steps) const {
+        const std::string script = world.path("script");
+        std::ofstream(script) << PALLAX_PROGRAM " " << arguments << " & p=$!\n"
+                              << "/usr/bin/python3 -W ignore " PALLAX_SOURCE_DIR
+                                 "/tests/window/drive.py "
+                              << steps << " || echo DRIVE FAILED\n"
+                              << "kill -TERM $p 2>/dev/null; wait $p; exit $?\n";
+        std::string command = "env -i ";
+        for (const std::string& variable : doubles::programEnvironment(world)) {
+            command += variable + " ";
+        }
+        return runCommand(command + "dbus-run-session -- sh " + script);
+    }
+
+    std::string sample(const std::string& name) const {
+        return PALLAX_SOURCE_DIR "/samples/" + name;
+    }
+
+    void expectDriven(const CommandRun& run, int status = 0) const {
+        EXPECT_EQ(run.out.find("DRIVE FAILED"), std::string::npos) << run.out;
+        EXPECT_EQ(run.status, status) << run.out;
+    }
+
+private:
+    doubles::XServer _server;
+};
+
+TEST_F(EndToEndWindow, ARecordingIsOpenedAndWalkedThroughByKeys) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Zorell_LTE · lte-drive.pcap' open 'Serving Cell Info' "
+                       "has 'Physical Cell ID: *' lacks Save"));
+}
+
+TEST_F(EndToEndWindow, ADemoRunsUntilItIsEnded) {
+    expectDriven(drive("demo gsm --seed 7", "has 'Zorell_GSM · simulated gsm' "
+                                            "has 'UMTS RR Info'"));
+}
+
+TEST_F(EndToEndWindow, ClosingTheWindowEndsTheProgram) {
+    expectDriven(drive("demo", "has 'SIM Info' press Close lacks 'SIM Info'"));
+}
+
+TEST_F(EndToEndWindow, ASnapshotIsSaved) {
+    const std::string folder = offerSaving(world.path("marker"));
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'SIM Info' press Save has 'DLF binary*' type 'tunnel entrance' "
+                       "press Save lacks 'DLF binary*' has 'Saved *'"));
+    std::string content;
+    for (const auto& entry : std::filesystem::directory_iterator(folder)) {
+        std::ifstream file(entry.path());
+        content.assign(std::istreambuf_iterator<char>(file), {});
+    }
+    EXPECT_NE(content.find("<key>Description</key>\n\t<string>tunnel entrance</string>"),
+              std::string::npos);
+}
+
+TEST_F(EndToEndWindow, AFailureToSaveIsAnAlertOverThePanes) {
+    offerSaving(world.path("missing/folder"));
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'SIM Info' press Save has 'DLF binary*' press Save "
+                       "has 'Unable to write file to disk' lacks 'DLF binary*'"));
+}
+
+TEST_F(EndToEndWindow, ARecordThatThrowsEndsTheProgramWithAPageAndASentence) {
+    const std::string recording = record("fatal.pcap", {{milliseconds(0), registration(0)},
+                                                        {milliseconds(10), unreadableSimFiles()}});
+    constexpr const char* kSentence =
+        "packet 2 (log code 0xFF0000): the embedded property list cannot be parsed";
+    const CommandRun run =
+        drive(recording + " --speed max",
+              "has 'Pallax has stopped' has '" + std::string(kSentence) + "*' press Close");
+    expectDriven(run, 70);
+    EXPECT_NE(run.out.find("pallax: " + std::string(kSentence)), std::string::npos) << run.out;
+}
+
+TEST_F(EndToEndWindow, AMissingRecordingIsASentence) {
+    const Run missing = run({world.path("none.pcap")});
+    EXPECT_EQ(missing.status, 1);
+    EXPECT_EQ(missing.err, "pallax: " + world.path("none.pcap") +
+                               " cannot be opened: No such file or directory.\n");
+}
+
+TEST_F(EndToEndWindow, ADamagedRecordingIsASentence) {
+    std::ofstream(world.path("damaged.pcap")) << "no capture";
+    const Run damaged = run({world.path("damaged.pcap")});
+    EXPECT_EQ(damaged.status, 1);
+    EXPECT_EQ(damaged.err, "pallax: " + world.path("damaged.pcap") +
+                               " is not a recording: it is neither pcap nor pcapng.\n");
+}
+
+TEST_F(EndToEndWindow, WithoutADisplayThereIsASentence) {
+    world.environment = {"GDK_BACKEND=x11"};
+    const Run none = run({"demo"});
+    EXPECT_EQ(none.status, 1);
+    EXPECT_EQ(none.err, "pallax: There is no display for a window; pallax shows the same in a "
+                        "terminal.\n");
+}
+
+} // namespace
+} // namespace pallax

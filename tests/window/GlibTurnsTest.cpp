@@ -1,0 +1,114 @@
+#include "window/GlibTurns.h"
+
+#include <gtest/gtest.h>
+
+#include <array>
+#include <chrono>
+#include <functional>
+#include <glib-unix.h>
+#include <stdexcept>
+#include <unistd.h>
+
+namespace pallax {
+namespace {
+
+using namespace std::chrono_literals;
+
+/// A timeout of GLib that calls the function once, after so many milliseconds.
+void onceAfter(guint delay, const std::function<void()>& action) {
+    g_timeout_add_full(
+        G_PRIORITY_DEFAULT, delay,
+        +[](gpointer data) -> gboolean {
+            (*static_cast<std::function<void()>*>(data))();
+            return G_SOURCE_REMOVE;
+        },
+        new std::function<void()>(action),
+        +[](gpointer data) { delete static_cast<std::function<void()>*>(data); });
+}
+
+TEST(GlibTurns, BlocksOfBothLoopsRunUntilTheQueueIsStopped) {
+    AsioMainQueue queue;
+    GlibTurns turns(queue);
+    std::vector<int> order;
+    queue.after(5ms, [&] {
+        order.push_back(1);
+        onceAfter(5, [&] {
+            order.push_back(2);
+            queue.async([&] {
+                order.push_back(3);
+                queue.stop();
+            });
+        });
+    });
+    turns.run();
+    EXPECT_EQ(order, (std::vector<int>{1, 2, 3}));
+}
+
+TEST(GlibTurns, ADescriptorThatGlibWatchesEndsTheWait) {
+    AsioMainQueue queue;
+    GlibTurns turns(queue);
+    std::array<int, 2> pipe{};
+    ASSERT_EQ(::pipe(pipe.data()), 0);
+    g_unix_fd_add(
+        pipe[0], G_IO_IN,
+        +[](gint /*descriptor*/, GIOCondition /*condition*/, gpointer data) -> gboolean {
+            static_cast<AsioMainQueue*>(data)->stop();
+            return G_SOURCE_REMOVE;
+        },
+        &queue);
+    queue.after(5ms, [&] { EXPECT_EQ(::write(pipe[1], "x", 1), 1); });
+    turns.run(); // hangs if it does not
+    (void)::close(pipe[0]);
+    (void)::close(pipe[1]);
+}
+
+TEST(GlibTurns, ADescriptorThatIsClosedAndOpenedAgainIsWatchedAgain) {
+    AsioMainQueue queue;
+    GlibTurns turns(queue);
+    for (int round = 0; round < 3; ++round) {
+        std::array<int, 2> pipe{};
+        ASSERT_EQ(::pipe(pipe.data()), 0);
+        g_unix_fd_add(
+            pipe[0], G_IO_IN,
+            +[](gint /*descriptor*/, GIOCondition /*condition*/, gpointer data) -> gboolean {
+                static_cast<AsioMainQueue*>(data)->stop();
+                return G_SOURCE_REMOVE;
+            },
+            &queue);
+        queue.after(1ms, [&] { EXPECT_EQ(::write(pipe[1], "x", 1), 1); });
+        turns.run();
+        (void)::close(pipe[0]);
+        (void)::close(pipe[1]);
+    }
+}
+
+TEST(GlibTurns, GlibGetsItsTurnWhileBlocksPostBlocks) {
+    AsioMainQueue queue;
+    GlibTurns turns(queue);
+    std::function<void()> again = [&] { queue.async(again); };
+    again();
+    onceAfter(1, [&] { queue.stop(); });
+    turns.run();
+}
+
+TEST(GlibTurns, AnExceptionOfABlockLeavesAndTheLoopsCanGoOn) {
+    AsioMainQueue queue;
+    GlibTurns turns(queue);
+    queue.async([] { throw std::runtime_error("broken"); });
+    EXPECT_THROW(turns.run(), std::runtime_error);
+    onceAfter(1, [&] { queue.stop(); });
+    turns.run();
+}
+
+TEST(GlibTurns, NothingRunsWhileNothingHappens) {
+    AsioMainQueue queue;
+    GlibTurns turns(queue);
+    const std::clock_t before = std::clock();
+    queue.after(300ms, [&] { queue.stop(); });
+    turns.run();
+    const double used = static_cast<double>(std::clock() - before) / CLOCKS_PER_SEC;
+    EXPECT_LT(used, 0.1) << "it turns without waiting";
+}
+
+} // namespace
+} // namespace pallax

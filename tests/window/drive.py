@@ -1,0 +1,160 @@
+#!/usr/bin/python3
+"""Drives pallax-window as a screen reader does: drive.py STEP...
+
+  has NAME         waits for something that is seen and has this name
+  lacks NAME       waits until nothing has it
+  press NAME       presses the button with this name
+  open NAME        goes to the row with this name by keys, and presses Enter
+  focus NAME       goes to it
+  key KEY          presses a key: Escape, Right
+  type TEXT        puts the text into the field
+  tree             prints all names
+
+A NAME that ends in * is the beginning of one. Prints what failed and ends with status 1.
+"""
+import sys
+import time
+
+import gi
+
+gi.require_version("Atspi", "2.0")
+from gi.repository import Atspi  # noqa: E402
+
+PATIENCE = 20  # seconds
+KEYS = {"Tab": 0xFF09, "Up": 0xFF52, "Return": 0xFF0D, "Escape": 0xFF1B, "Right": 0xFF53, "Left": 0xFF51, "Down": 0xFF54}
+
+
+def children(node):
+    try:
+        return [node.get_child_at_index(index) for index in range(node.get_child_count())]
+    except Exception:  # it is gone
+        return []
+
+
+def windows():
+    for application in children(Atspi.get_desktop(0)):
+        if application is not None and "pallax" in (application.get_name() or "").lower():
+            yield from children(application)
+
+
+def walk(node):
+    if node is None:
+        return
+    yield node
+    for child in children(node):
+        yield from walk(child)
+
+
+def is_shown(node):
+    states = node.get_state_set()
+    return states.contains(Atspi.StateType.VISIBLE)
+
+
+def find(name, role=None):
+    """The last one: pages that are covered by others come before them."""
+    found = None
+    for window in windows():
+        for node in walk(window):
+            try:
+                own = node.get_name() or ""
+                matches = own.startswith(name[:-1]) if name.endswith("*") else own == name
+                if matches and (role is None or node.get_role() == role) and is_shown(node):
+                    found = node
+            except Exception:  # it is gone
+                continue
+    return found
+
+
+def await_result(look, what):
+    end = time.monotonic() + PATIENCE
+    while time.monotonic() < end:
+        result = look()
+        if result:
+            return result
+        time.sleep(0.05)
+    sys.exit(what + "\n" + tree())
+
+
+def tree():
+    lines = []
+    for window in windows():
+        for node in walk(window):
+            lines.append("%s %r" % (node.get_role_name(), node.get_name()))
+    return "\n".join(lines)
+
+
+def press_key(name):
+    Atspi.generate_keyboard_event(KEYS[name], None, Atspi.KeySynthType.SYM)
+
+
+def has_focus(node):
+    node.clear_cache()
+    return node.get_state_set().contains(Atspi.StateType.FOCUSED)
+
+
+def walk_to(item):
+    """Goes to a row of a list by Tab and the arrows, as a user without a mouse does."""
+    while item.get_role() != Atspi.Role.LIST_ITEM:
+        item = item.get_parent()
+
+    def rows():
+        return [each for each in children(item.get_parent())]
+
+    for _ in range(30):
+        if any(has_focus(each) for each in rows()):
+            break
+        press_key("Tab")
+        time.sleep(0.1)
+    wanted = item.get_index_in_parent()
+    for _ in range(60):
+        at = next((each.get_index_in_parent() for each in rows() if has_focus(each)), None)
+        if at == wanted:
+            return
+        press_key("Down" if at is None or at < wanted else "Up")
+        time.sleep(0.1)
+    sys.exit("cannot go to the row\n" + tree())
+
+
+def field():
+    for window in windows():
+        for node in walk(window):
+            if node.get_role() in (Atspi.Role.TEXT, Atspi.Role.ENTRY) and is_shown(node):
+                editable = node.get_editable_text_iface()
+                if editable is not None:
+                    return editable
+    return None
+
+
+def step(verb, argument):
+    if verb == "has":
+        await_result(lambda: find(argument), "nothing is named " + argument)
+    elif verb == "lacks":
+        await_result(lambda: find(argument) is None, "still there: " + argument)
+    elif verb == "press":
+        button = await_result(lambda: find(argument, Atspi.Role.PUSH_BUTTON), "no button " + argument)
+        button.get_action_iface().do_action(0)
+    elif verb == "open":
+        row = await_result(lambda: find(argument), "no row " + argument)
+        walk_to(row)
+        press_key("Return")
+    elif verb == "focus":
+        walk_to(await_result(lambda: find(argument), "no row " + argument))
+    elif verb == "key":
+        press_key(argument)
+    elif verb == "type":
+        await_result(field, "no field").set_text_contents(argument)
+    else:
+        sys.exit("unknown step " + verb)
+
+
+def main(words):
+    while words:
+        if words[0] == "tree":
+            print(tree())
+            words = words[1:]
+        else:
+            step(words[0], words[1])
+            words = words[2:]
+
+
+main(sys.argv[1:])

@@ -1,0 +1,295 @@
+#include "ui/gtk/MainFrame.h"
+
+#include "ui/gtk/SaveScreen.h"
+#include "ui/gtk/ShownText.h"
+#include "ui/gtk/Style.h"
+
+#include <utility>
+#include <variant>
+
+namespace pallax::gtk {
+
+namespace {
+
+constexpr int kUsualWidth = 720;
+constexpr int kUsualHeight = 640;
+constexpr int kLeastWidth = 320;
+constexpr int kLeastHeight = 240;
+constexpr const char* kPanesPage = "panes";
+constexpr const char* kModalPage = "modal";
+constexpr const char* kEndedPage = "ended";
+
+/// A name for screen readers, and a tooltip.
+void name(GtkWidget* widget, const char* text) {
+    gtk_widget_set_tooltip_text(widget, text);
+    gtk_accessible_update_property(GTK_ACCESSIBLE(widget), GTK_ACCESSIBLE_PROPERTY_LABEL, text, -1);
+}
+
+} // namespace
+
+MainFrame::MainFrame(GtkApplication* application, const Guard& guard, Actions actions)
+    : _guard(guard), _actions(std::move(actions)),
+      _window(shared(GTK_WIDGET(
+          g_object_new(ADW_TYPE_APPLICATION_WINDOW, "application", application, nullptr)))),
+      _metrics(_window.get()), _toasts(ADW_TOAST_OVERLAY(adw_toast_overlay_new())),
+      _pages(GTK_STACK(gtk_stack_new())), _header(ADW_HEADER_BAR(adw_header_bar_new())),
+      _title(ADW_WINDOW_TITLE(adw_window_title_new("Pallax", ""))),
+      _back(GTK_BUTTON(gtk_button_new_from_icon_name("go-previous-symbolic"))),
+      _oldValues(GTK_LABEL(gtk_label_new(nullptr))), _panes(ADW_BIN(adw_bin_new())),
+      _toolbar(GTK_BOX(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 8))),
+      _spinner(GTK_SPINNER(gtk_spinner_new())), _status(GTK_LABEL(gtk_label_new(nullptr))),
+      _remarks(GTK_LABEL(gtk_label_new(nullptr))),
+      _save(GTK_BUTTON(gtk_button_new_with_label("Save"))) {
+    addStyle();
+    build();
+    listen();
+}
+
+MainFrame::~MainFrame() {
+    for (const auto& [instance, handler] : _handlers) {
+        g_signal_handler_disconnect(instance, handler);
+    }
+    gtk_window_destroy(window());
+}
+
+void MainFrame::build() {
+    gtk_window_set_title(window(), "Pallax");
+    gtk_window_set_default_size(window(), kUsualWidth, kUsualHeight);
+    gtk_widget_set_size_request(_window.get(), kLeastWidth, kLeastHeight);
+    name(GTK_WIDGET(_back), "Back");
+    gtk_widget_set_visible(GTK_WIDGET(_back), FALSE);
+    adw_header_bar_pack_start(_header, GTK_WIDGET(_back));
+    adw_header_bar_set_title_widget(_header, GTK_WIDGET(_title));
+    gtk_widget_add_css_class(GTK_WIDGET(_oldValues), "pallax-banner");
+    gtk_label_set_wrap(_oldValues, TRUE);
+    showText(_oldValues, "");
+    gtk_widget_set_vexpand(GTK_WIDGET(_panes), TRUE);
+
+    GtkWidget* page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
+    for (GtkWidget* child :
+         {GTK_WIDGET(_header), GTK_WIDGET(_oldValues), GTK_WIDGET(_panes), buildToolbar()}) {
+        gtk_box_append(GTK_BOX(page), child);
+    }
+    gtk_stack_add_named(_pages, page, kPanesPage);
+    gtk_stack_set_transition_type(_pages, GTK_STACK_TRANSITION_TYPE_OVER_UP_DOWN);
+    adw_toast_overlay_set_child(_toasts, GTK_WIDGET(_pages));
+    adw_application_window_set_content(ADW_APPLICATION_WINDOW(_window.get()), GTK_WIDGET(_toasts));
+}
+
+GtkWidget* MainFrame::buildToolbar() {
+    GtkWidget* toolbar = GTK_WIDGET(_toolbar);
+    gtk_widget_add_css_class(toolbar, "toolbar");
+    gtk_widget_add_css_class(toolbar, "pallax-toolbar");
+    gtk_widget_set_visible(toolbar, FALSE);
+    gtk_widget_set_visible(GTK_WIDGET(_spinner), FALSE);
+    gtk_widget_set_visible(GTK_WIDGET(_save), FALSE);
+    name(GTK_WIDGET(_spinner), "Connecting");
+    gtk_widget_add_css_class(GTK_WIDGET(_remarks), "dim-label");
+    gtk_label_set_ellipsize(_remarks, PANGO_ELLIPSIZE_END);
+    gtk_label_set_xalign(_remarks, 0);
+    gtk_widget_set_hexpand(GTK_WIDGET(_remarks), TRUE);
+    for (GtkWidget* child :
+         {GTK_WIDGET(_spinner), GTK_WIDGET(_status), GTK_WIDGET(_remarks), GTK_WIDGET(_save)}) {
+        gtk_box_append(_toolbar, child);
+    }
+    return toolbar;
+}
+
+void MainFrame::listen() {
+    onSignal(_back, "clicked", _guard, [this] { back(); });
+    onSignal(_save, "clicked", _guard, [this] { _saveAction(); });
+    connect(_window.get(), "close-request", _guard, std::function<gboolean()>([this]() -> gboolean {
+                _guard.queue().async(_actions.closed);
+                return TRUE; // the window goes with the program
+            }));
+    GtkEventController* keys = gtk_event_controller_key_new();
+    connect(keys, "key-pressed", _guard,
+            std::function<gboolean(guint, guint, GdkModifierType)>(
+                [this](guint key, guint code, GdkModifierType state) {
+                    return handleKey(key, code, state);
+                }));
+    gtk_widget_add_controller(_window.get(), keys);
+    GtkSettings* settings = gtk_settings_get_default();
+    for (const char* property : {"notify::gtk-xft-dpi", "notify::gtk-font-name"}) {
+        _handlers.emplace_back(settings, onSignal(settings, property, _guard, [this] {
+                                   (void)_metrics.adoptSettings();
+                                   if (_stack != nullptr) {
+                                       for (const auto& screen : _stack->screens()) {
+                                           screen->table().reloadData();
+                                       }
+                                   }
+                               }));
+    }
+}
+
+ui::Rect MainFrame::bounds() const {
+    int width = gtk_widget_get_width(_window.get());
+    int height = gtk_widget_get_height(_window.get());
+    if (width <= 0 || height <= 0) { // not shown so far
+        gtk_window_get_default_size(window(), &width, &height);
+    }
+    return {{}, {width / _metrics.scale(), height / _metrics.scale()}};
+}
+
+void MainFrame::setStack(WidgetNavigation* stack) {
+    _stack = stack;
+    modalChanged();
+    adw_bin_set_child(_panes, stack != nullptr ? stack->widget() : nullptr);
+    if (stack != nullptr && _detail) {
+        stack->setDetail(_detail.get());
+    }
+    refresh();
+}
+
+void MainFrame::setDetail(GtkWidget* widget) {
+    _detail = shared(widget);
+    if (_stack != nullptr) {
+        _stack->setDetail(widget);
+    }
+}
+
+void MainFrame::setMenu(GtkWidget* button) {
+    adw_header_bar_pack_end(_header, button);
+}
+
+void MainFrame::refresh() {
+    if (_stack == nullptr) {
+        return;
+    }
+    adw_window_title_set_title(_title, shownText(_stack->top().title()).c_str());
+    gtk_widget_set_visible(GTK_WIDGET(_back), _stack->isAtRoot() ? FALSE : TRUE);
+    gtk_widget_set_visible(GTK_WIDGET(_toolbar), _stack->isToolbarShown() ? TRUE : FALSE);
+    showToolbarItems(_stack->top().toolbarItems());
+}
+
+/// The widgets stay, so that the focus stays on the button.
+void MainFrame::showToolbarItems(const ui::BarItems& items) {
+    bool canSave = false;
+    for (const ui::BarItem& item : items) {
+        if (const auto* indicator = std::get_if<ui::ActivityIndicator>(&item)) {
+            gtk_spinner_set_spinning(_spinner, indicator->isSpinning ? TRUE : FALSE);
+            const bool isHidden = !indicator->isSpinning && indicator->hidesWhenStopped;
+            gtk_widget_set_visible(GTK_WIDGET(_spinner), isHidden ? FALSE : TRUE);
+        } else if (const auto* label = std::get_if<ui::Label>(&item)) {
+            const auto attributes = _metrics.attributes(label->font);
+            gtk_label_set_attributes(_status, attributes.get());
+            gtk_label_set_text(_status, shownText(label->text).c_str());
+        } else if (const auto* button = std::get_if<ui::SaveButton>(&item)) {
+            _saveAction = button->action;
+            canSave = true;
+        }
+    }
+    gtk_widget_set_visible(GTK_WIDGET(_save), canSave ? TRUE : FALSE);
+}
+
+void MainFrame::modalChanged() {
+    const bool isOpen = _stack != nullptr && _stack->modal() != nullptr;
+    if (_modal != nullptr) {
+        gtk_stack_set_visible_child_name(_pages, kPanesPage);
+        gtk_stack_remove(_pages, std::exchange(_modal, nullptr));
+    }
+    if (isOpen) {
+        _modal = saveScreen(*_stack->modal(), _guard);
+        gtk_stack_add_named(_pages, _modal, kModalPage);
+        gtk_stack_set_visible_child_name(_pages, kModalPage);
+        gtk_widget_grab_focus(widgetTextField(_stack->modal()->field()).widget());
+    }
+}
+
+void MainFrame::present() {
+    gtk_window_present(window());
+}
+
+void MainFrame::hide() {
+    gtk_widget_set_visible(_window.get(), FALSE);
+}
+
+void MainFrame::showAlert(const ui::Alert& alert) {
+    constexpr const char* kClose = "close";
+    auto* dialog = ADW_MESSAGE_DIALOG(adw_message_dialog_new(
+        window(), shownText(alert.title).c_str(), shownText(alert.message).c_str()));
+    adw_message_dialog_add_response(dialog, kClose, alert.button.c_str());
+    adw_message_dialog_set_close_response(dialog, kClose);
+    gtk_window_present(GTK_WINDOW(dialog));
+}
+
+void MainFrame::setMessage(const std::string& text) {
+    adw_toast_overlay_add_toast(_toasts, adw_toast_new(shownMarkup(text).c_str()));
+}
+
+void MainFrame::setNote(std::string text) {
+    _note = std::move(text);
+    showRemarks();
+}
+
+void MainFrame::setStream(std::string state) {
+    _stream = std::move(state);
+    showRemarks();
+}
+
+void MainFrame::setAlarms(const std::vector<std::string>& names) {
+    _alarms.clear();
+    for (const std::string& alarm : names) {
+        _alarms += (_alarms.empty() ? "alarm: " : ", ") + alarm;
+    }
+    showRemarks();
+}
+
+void MainFrame::showRemarks() {
+    std::string text;
+    for (const std::string* part : {&_alarms, &_stream, &_note}) {
+        if (!part->empty()) {
+            text += (text.empty() ? "" : " · ") + *part;
+        }
+    }
+    gtk_label_set_text(_remarks, shownText(text).c_str());
+    gtk_widget_set_tooltip_text(GTK_WIDGET(_remarks),
+                                text.empty() ? nullptr : shownText(text).c_str());
+}
+
+void MainFrame::setOrigin(const std::string& technology, const std::string& source) {
+    const std::string text = technology.empty() ? source : technology + " · " + source;
+    adw_window_title_set_subtitle(_title, shownText(text).c_str());
+}
+
+void MainFrame::setOldValues(const std::string& time) {
+    showText(_oldValues, time.empty() ? "" : "The link was restarted: values from before " + time);
+}
+
+void MainFrame::showEnded(const std::string& sentence) {
+    GtkWidget* page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
+    gtk_box_append(GTK_BOX(page), adw_header_bar_new());
+    GtkWidget* status = adw_status_page_new();
+    adw_status_page_set_icon_name(ADW_STATUS_PAGE(status), "dialog-error-symbolic");
+    adw_status_page_set_title(ADW_STATUS_PAGE(status), "Pallax has stopped");
+    adw_status_page_set_description(ADW_STATUS_PAGE(status), shownMarkup(sentence).c_str());
+    GtkWidget* close = gtk_button_new_with_label("Close");
+    gtk_widget_add_css_class(close, "pill");
+    gtk_widget_set_halign(close, GTK_ALIGN_CENTER);
+    onSignal(close, "clicked", _guard, [this] { _guard.queue().async(_actions.closed); });
+    adw_status_page_set_child(ADW_STATUS_PAGE(status), close);
+    gtk_widget_set_vexpand(status, TRUE);
+    gtk_box_append(GTK_BOX(page), status);
+    gtk_stack_add_named(_pages, page, kEndedPage);
+    gtk_stack_set_visible_child_name(_pages, kEndedPage);
+    gtk_widget_grab_focus(close);
+}
+
+void MainFrame::back() {
+    if (_stack != nullptr && _stack->modal() != nullptr) {
+        _stack->modal()->cancelPressed();
+    } else if (_stack != nullptr) {
+        _stack->back();
+    }
+}
+
+gboolean MainFrame::handleKey(guint key, guint /*code*/, GdkModifierType state) {
+    const bool isAlt = (state & GDK_ALT_MASK) != 0;
+    if (key == GDK_KEY_Escape || key == GDK_KEY_Back || (isAlt && key == GDK_KEY_Left)) {
+        back();
+        return TRUE;
+    }
+    return FALSE;
+}
+
+} // namespace pallax::gtk

@@ -1,0 +1,24 @@
+#include "ui/gtk/ShownText.h"
+
+#include "text/Printable.h"
+
+namespace pallax::gtk {
+
+std::string shownText(std::string_view text) {
+    return printable(text);
+}
+
+std::string shownMarkup(std::string_view text) {
+    const std::string shown = shownText(text);
+    gchar* escaped = g_markup_escape_text(shown.data(), static_cast<gssize>(shown.size()));
+    std::string markup = escaped;
+    g_free(escaped);
+    return markup;
+}
+
+void showText(GtkLabel* label, std::string_view text) {
+    gtk_label_set_text(label, shownText(text).c_str());
+    gtk_widget_set_visible(GTK_WIDGET(label), text.empty() ? FALSE : TRUE);
+}
+
+} // namespace pallax::gtk

@@ -1,0 +1,18 @@
+#pragma once
+
+#include <gtk/gtk.h>
+#include <string>
+#include <string_view>
+
+/// Texts from a modem, a SIM or a file name, in widgets.
+namespace pallax::gtk {
+
+/// What a widget shows of a text: never a character that turns the direction of the text around it.
+std::string shownText(std::string_view text);
+/// The same for a widget that takes markup.
+std::string shownMarkup(std::string_view text);
+
+/// Shows the text; a label without one is not seen.
+void showText(GtkLabel* label, std::string_view text);
+
+} // namespace pallax::gtk

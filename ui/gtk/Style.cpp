@@ -1,0 +1,42 @@
+#include "ui/gtk/Style.h"
+
+#include "ui/gtk/Ref.h"
+
+#include <gtk/gtk.h>
+
+namespace pallax::gtk {
+
+namespace {
+
+/// The layouts have their own margins: the theme's would add to them.
+constexpr const char* kStyle = R"(
+.pallax-rows { background: none; }
+.pallax-rows > row { padding: 0; margin: 0; border-radius: 0; }
+.pallax-rows label { padding: 0; }
+.pallax-rows undershoot.right {
+    background: linear-gradient(to left, alpha(@window_fg_color, 0.3), transparent 14px);
+}
+.pallax-rows undershoot.left {
+    background: linear-gradient(to right, alpha(@window_fg_color, 0.3), transparent 14px);
+}
+.pallax-changed { color: @accent_color; }
+.pallax-open { background: alpha(@accent_bg_color, 0.2); }
+.pallax-toolbar { border-top: 1px solid @borders; min-height: 34px; padding: 4px 10px; }
+.pallax-banner { padding: 4px 10px; background: alpha(@warning_bg_color, 0.3); }
+)";
+
+} // namespace
+
+void addStyle() {
+    static const bool isAdded = [] {
+        const Ref<GtkCssProvider> provider(gtk_css_provider_new());
+        gtk_css_provider_load_from_data(provider.get(), kStyle, -1);
+        gtk_style_context_add_provider_for_display(gdk_display_get_default(),
+                                                   GTK_STYLE_PROVIDER(provider.get()),
+                                                   GTK_STYLE_PROVIDER_PRIORITY_APPLICATION);
+        return true;
+    }();
+    (void)isAdded;
+}
+
+} // namespace pallax::gtk
