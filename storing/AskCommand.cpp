@@ -5,6 +5,7 @@
 #include "host/MonotonicClock.h"
 #include "query/Functions.h"
 #include "querying/QueryRun.h"
+#include "store/StoreConnection.h"
 #include "storing/Loading.h"
 #include "storing/Questions.h"
 #include "text/Format.h"

@@ -4,6 +4,7 @@
 #include "host/Sha256.h"
 #include "host/UserFolders.h"
 #include "masking/KeyFile.h"
+#include "store/FileStore.h"
 #include "text/Counted.h"
 #include "text/Format.h"
 
@@ -65,11 +66,11 @@ Loading::Loading(const LoadingOptions& options)
         _identities = "pseudonyms " + nameOfKey(*key);
         _replacements.identities = Replacement(std::move(key).value());
     }
-    const MeasurementStore store(_file); // not kept: other processes may be made
+    const FileStore store(_file); // not kept: other processes may be made
 }
 
 ExitStatus Loading::load(const std::string& path, const Seams& seams) {
-    MeasurementStore store(_file);
+    FileStore store(_file);
     if (seams.isAlone) {
         store.connection().setWaiting([&] {
             seams.complain(
