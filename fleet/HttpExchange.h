@@ -16,6 +16,7 @@ struct Patience {
     std::chrono::milliseconds connect{10'000};
     std::chrono::milliseconds silence{60'000};           ///< nothing is sent or received
     std::optional<std::chrono::milliseconds> whole = {}; ///< of one exchange
+    std::chrono::milliseconds copies{10'000}; ///< replicas get nothing of what was loaded
 };
 
 /// Requests to the server of a store, over one connection. Proxies and redirections are not used.

@@ -270,7 +270,9 @@ void ServerStore::addFields(const RecordingMeasurements& measurements) {
 }
 
 /// Copies get the rows of a table in any order, and those of two tables independently. So all must
-/// have all rows before the load's own row is written.
+/// have all rows before the load's own row is written. Servers of other shards may be missing:
+/// without them nothing of this load is missed, and without one of its own shard the count is
+/// short.
 void ServerStore::waitForCopies() {
     if (_copies < 2) {
         return;
@@ -284,18 +286,26 @@ void ServerStore::waitForCopies() {
     for (const std::string& field : _fields) {
         fields += ", " + clickHouseText(field);
     }
-    const auto start = std::chrono::steady_clock::now();
+    constexpr const char* kWithoutOthers = " SETTINGS skip_unavailable_shards = 1";
+    auto latest = std::chrono::steady_clock::now();
+    std::int64_t most = 0;
     while (true) {
         std::int64_t there = 0;
         for (const std::string& query :
              {"intervals_everywhere WHERE field IN (" + fields + ") AND " + own,
               "events_everywhere WHERE " + own, "cells_everywhere WHERE " + own}) {
-            there += integerOf(_server.rows("SELECT count() FROM " + query, 1).at(0)[0]);
+            there += integerOf(
+                _server.rows("SELECT count() FROM " + query + kWithoutOthers, 1).at(0)[0]);
         }
         if (there == _rows * _copies) {
             return;
         }
-        if (std::chrono::steady_clock::now() - start >= _patience.silence) {
+        const auto now = std::chrono::steady_clock::now();
+        if (there > most) {
+            most = there;
+            latest = now;
+        }
+        if (now - latest >= _patience.copies) {
             throw StoreFailure(formatText("%@: not all copies of a shard have what was sent; "
                                           "nothing was loaded.",
                                           {_server.address().text()}));
