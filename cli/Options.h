@@ -51,7 +51,8 @@ using ParsedOptions =
                  ServiceListOptions, SimulateOptions, EventsOptions, FieldsOptions, ExplainOptions,
                  InfoOptions, SnapshotOptions, SqlOptions, StatusOptions, DiffOptions, WatchOptions,
                  MaskOptions, VerifyOptions, ReportOptions, ModemListOptions, ModemPolicyOptions,
-                 WebOptions, StoreLoadOptions, StoreWatchOptions, StoreAskOptions, ParseEnd>;
+                 WebOptions, StoreLoadOptions, StoreWatchOptions, StoreAskOptions,
+                 StoreSetupOptions, ParseEnd>;
 
 /// The options of these commands, which must outlive the app.
 void addBrowse(CLI::App& app, BrowseOptions& options);

@@ -18,10 +18,24 @@ constexpr const char* kStoreFooter = R"(Examples:
   pallax store query series measured_rsrp --device car1 --every 1h
   pallax store query compare 2026-11-20 2026-11-21
   pallax store query --sql "select * from event where kind = 'service-lost'"
+  pallax store setup --into clickhouse://db1/fleet
+  pallax store load --into clickhouse://db1/fleet monday/*.pcapng
 
 A store is one file that holds the measurements of many recordings and devices:
 every value for as long as it held, in which cell. --into and --store name it;
 the usual one is measurements.db in $XDG_DATA_HOME/pallax.
+
+For a fleet, a store is a database of ClickHouse, on one server or on the shards
+of a cluster: clickhouse://HOST[:PORT]/DATABASE. It answers the same questions.
+Port 8123 is usual and speaks HTTP; 8443 speaks HTTPS. User and password come
+from PALLAX_CLICKHOUSE_USER and PALLAX_CLICKHOUSE_PASSWORD, or from ~/.netrc.
+Loading needs all servers of the shard of the device, and a question needs one
+of each shard; without them there is an error, never a part of an answer.
+
+setup [CLUSTER [SERVERS]] makes the tables of such a store on the server of
+--into, and is run once for each server. CLUSTER is the name of the cluster in
+the servers' configuration. If its shards have replicas, SERVERS is a cluster
+that has each server as a shard.
 
 load reads recordings and tells what became of each. A recording is known by its
 packets: loading it again changes nothing, wherever the file is. It is replaced
@@ -65,7 +79,8 @@ grade of the profile.
 --sql: a query on the views span, event, cell and field, which are those of
 pallax-sql(7) with the columns device and recording; on measurement, which
 also tells the serving cell; or on the tables of the file, which sqlite3 opens,
-too. Times of values are in whole milliseconds.
+too. Times of values are in whole milliseconds. A server has the dialect of
+ClickHouse.
 
 Exit status:
   0   success, or the reader of the output has gone
@@ -194,24 +209,35 @@ ParsedOptions askOptions(const StoreRequest& request) {
                       "store");
 }
 
+ParsedOptions setupOptions(const StoreRequest& request) {
+    const auto& words = request.words;
+    if (words.size() > 2) {
+        return wrongUsage("setup takes one or two clusters", "store");
+    }
+    return StoreSetupOptions{request.loading.store,
+                             {words.empty() ? "" : words[0], words.size() < 2 ? "" : words[1]}};
+}
+
 } // namespace
 
 void addStore(CLI::App& app, StoreRequest& request) {
     addChoice<StoreRequest::Action>(app, "ACTION", request.action,
                                     {{"load", StoreRequest::Action::Load},
                                      {"query", StoreRequest::Action::Query},
-                                     {"watch", StoreRequest::Action::Watch}},
+                                     {"watch", StoreRequest::Action::Watch},
+                                     {"setup", StoreRequest::Action::Setup}},
                                     "What to do")
         ->required();
     app.add_option(
            "WORDS", request.words,
            "The recordings to load (pcap or pcapng), or a question: devices, recordings, "
            "cells, series FIELD, compare A B, coverage or, with --sql, a query; or the folder to "
-           "watch")
+           "watch; or clusters to set up")
         ->type_name("");
     app.add_option("--into,--store", request.loading.store,
-                   "The file of the store (default: measurements.db in the folder for data)")
-        ->type_name("FILE");
+                   "The file or the address of the store (default: measurements.db in the folder "
+                   "for data)")
+        ->type_name("FILE|clickhouse://HOST/DATABASE");
     addLoading(app, request);
     addEvery(app, request);
     addAsking(app, request.asking);
@@ -220,6 +246,9 @@ void addStore(CLI::App& app, StoreRequest& request) {
 }
 
 ParsedOptions storeOptions(const StoreRequest& request) {
+    if (request.action == StoreRequest::Action::Setup) {
+        return setupOptions(request);
+    }
     if (request.action == StoreRequest::Action::Query) {
         return askOptions(request);
     }

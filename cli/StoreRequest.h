@@ -9,13 +9,13 @@ namespace pallax {
 
 /// What the user wants of a store.
 struct StoreRequest {
-    enum class Action { Load, Query, Watch };
+    enum class Action { Load, Query, Watch, Setup };
 
     Action action = Action::Load;
     LoadingOptions loading = {};
     std::optional<unsigned> jobs = {};
     StoreAskOptions asking = {};
-    std::vector<std::string> words = {}; ///< recordings, a question, or a folder
+    std::vector<std::string> words = {}; ///< recordings, a question, a folder or clusters
     bool sql = false;                    ///< the question is a query
 };
 

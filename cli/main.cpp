@@ -53,6 +53,7 @@ struct Run {
     ExitStatus operator()(const ReportOptions& options) const { return runReport(options); }
     ExitStatus operator()(const WebOptions& options) const { return runWeb(options); }
     ExitStatus operator()(const StoreLoadOptions& options) const { return runStoreLoad(options); }
+    ExitStatus operator()(const StoreSetupOptions& options) const { return runStoreSetup(options); }
     ExitStatus operator()(const StoreWatchOptions& options) const { return runStoreWatch(options); }
     ExitStatus operator()(const StoreAskOptions& options) const { return runStoreAsk(options); }
     ExitStatus operator()(const ModemListOptions& options) const { return runModemList(options); }

@@ -1,51 +1,9 @@
 #include "store/MeasurementStore.h"
 
-#include "query/CellFinder.h"
-#include "query/TimelineTables.h"
-#include "store/NamedRows.h"
-
 #include <algorithm>
 #include <bit>
 
 namespace pallax {
-
-namespace {
-
-/// The columns as `recordingOf` takes them.
-std::string selectRecordings(const std::string& condition) {
-    return "SELECT id, device, name, digest, beginnings, technology, decoder, every, identities, "
-           "packets, "
-           "first, last, trouble FROM recordings WHERE " +
-           condition;
-}
-
-LoadedRecording recordingOf(const Statement& row) {
-    LoadedRecording recording;
-    int column = 0;
-    recording.id = row.integer(column++);
-    for (std::string* text :
-         {&recording.device, &recording.name, &recording.digest, &recording.beginnings,
-          &recording.technology, &recording.decoder, &recording.every, &recording.identities}) {
-        *text = row.text(column++);
-    }
-    for (std::int64_t* number : {&recording.packets, &recording.first, &recording.last}) {
-        *number = row.integer(column++);
-    }
-    if (!row.isNull(column)) {
-        recording.trouble = row.text(column);
-    }
-    return recording;
-}
-
-std::string joined(const std::vector<std::string>& names) {
-    std::string text;
-    for (const std::string& name : names) {
-        text.append(text.empty() ? "" : " ").append(name);
-    }
-    return text;
-}
-
-} // namespace
 
 bool haveSameBeginning(const LoadedRecording& one, const LoadedRecording& other) {
     const auto packets = static_cast<std::uint64_t>(std::min(one.packets, other.packets));
@@ -57,95 +15,6 @@ bool haveSameBeginning(const LoadedRecording& one, const LoadedRecording& other)
                    : recording.beginnings.substr(at, recording.beginnings.find(' ', at + 1) - at);
     };
     return !digestOf(one).empty() && digestOf(one) == digestOf(other);
-}
-
-std::optional<LoadedRecording> MeasurementStore::withDigest(const std::string& digest) {
-    Statement find = _connection->prepare(selectRecordings("digest = ?").c_str());
-    return find.bind(1, digest).step() ? std::optional(recordingOf(find)) : std::nullopt;
-}
-
-std::vector<LoadedRecording> MeasurementStore::beginningAt(const std::string& technology,
-                                                           std::int64_t first) {
-    Statement find = _connection->prepare(selectRecordings("first = ? AND technology = ?").c_str());
-    find.bind(1, first).bind(2, technology);
-    std::vector<LoadedRecording> recordings;
-    while (find.step()) {
-        recordings.push_back(recordingOf(find));
-    }
-    return recordings;
-}
-
-std::int64_t MeasurementStore::add(const LoadedRecording& recording) {
-    Statement add = _connection->prepare(
-        "INSERT INTO recordings (device, name, digest, beginnings, technology, decoder, every, "
-        "identities, packets, first, last, trouble) VALUES (?, ?, ?, ?, ?, ?, ?, ?, ?, ?, ?, ?) "
-        "RETURNING id");
-    int parameter = 1;
-    for (const std::string* text :
-         {&recording.device, &recording.name, &recording.digest, &recording.beginnings,
-          &recording.technology, &recording.decoder, &recording.every, &recording.identities}) {
-        add.bind(parameter++, *text);
-    }
-    for (const std::int64_t number : {recording.packets, recording.first, recording.last}) {
-        add.bind(parameter++, number);
-    }
-    add.bind(parameter, recording.trouble).step();
-    const std::int64_t id = add.integer(0);
-    add.run();
-    return id;
-}
-
-void MeasurementStore::setTrouble(std::int64_t recording, const std::string& trouble) {
-    _connection->prepare("UPDATE recordings SET trouble = ? WHERE id = ?")
-        .bind(1, trouble)
-        .bind(2, recording)
-        .run();
-}
-
-void MeasurementStore::addEvents(std::int64_t recording, const std::vector<Event>& events) {
-    Statement add = _connection->prepare("INSERT INTO events VALUES (?, ?, ?, ?, ?, ?)");
-    for (const Event& event : events) {
-        add.bind(1, recording).bind(2, microseconds(event.time));
-        add.bind(3, static_cast<std::int64_t>(event.packet)).bind(4, wordOf(event.kind));
-        add.bind(5, event.words).bind(6, joined(event.fields)).run();
-    }
-}
-
-void MeasurementStore::addCells(std::int64_t recording, const std::vector<FoundCell>& cells) {
-    Statement add =
-        _connection->prepare("INSERT INTO cells VALUES (?, ?, ?, ?, ?, ?, ?, ?, ?, ?, ?, ?, ?)");
-    for (const FoundCell& cell : cells) {
-        const auto level = [&](auto value) {
-            return cell.hasLevel ? std::optional(value) : std::nullopt;
-        };
-        int column = 0;
-        add.bind(++column, recording);
-        add.bind(++column, wordOf(cell.role));
-        add.bind(++column, nameOf(cell.system));
-        add.bind(++column, cell.identity);
-        bindAny(add, ++column, cell.code);
-        bindAny(add, ++column, cell.channel);
-        add.bind(++column, microseconds(cell.first));
-        add.bind(++column, microseconds(cell.last));
-        add.bind(++column, static_cast<std::int64_t>(cell.packet));
-        add.bind(++column, static_cast<std::int64_t>(cell.readings));
-        add.bind(++column, level(infoOf(cellTermsOf(cell.system).level).name));
-        add.bind(++column, level(cell.best));
-        add.bind(++column, level(cell.latest));
-        add.run();
-    }
-}
-
-void MeasurementStore::remove(std::int64_t recording) {
-    constexpr const char* kIntervals =
-        "DELETE FROM intervals WHERE id BETWEEN (SELECT min(first_row) FROM series WHERE recording "
-        "= ?1) AND (SELECT max(last_row) FROM series WHERE recording = ?1)";
-    for (const char* sql :
-         {kIntervals, "DELETE FROM series WHERE recording = ?1",
-          "DELETE FROM events WHERE recording = ?1", "DELETE FROM cells WHERE recording = ?1",
-          "DELETE FROM recordings WHERE id = ?1"}) {
-        _connection->prepare(sql).bind(1, recording).run();
-    }
 }
 
 } // namespace pallax

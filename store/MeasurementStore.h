@@ -1,21 +1,27 @@
 #pragma once
 
-#include "store/StoreConnection.h"
 #include "timeline/Event.h"
 
 #include <cstdint>
-#include <memory>
 #include <optional>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
 namespace pallax {
 
-struct FoundCell;
+class IntervalBatch;
+class RecordingMeasurements;
+
+/// Why a store cannot be read or written: one sentence that names it.
+class StoreFailure : public std::runtime_error {
+public:
+    using std::runtime_error::runtime_error;
+};
 
 /// A recording in a store. Times are milliseconds since 1970.
 struct LoadedRecording {
-    std::int64_t id = 0;
+    std::uint64_t id = 0;
     std::string device;
     std::string name; ///< of the file
     std::string digest;
@@ -34,29 +40,31 @@ struct LoadedRecording {
 /// digests of their beginnings tell.
 bool haveSameBeginning(const LoadedRecording& one, const LoadedRecording& other);
 
-/// The recordings of a store. All functions may throw StoreFailure.
+/// The recordings of a store: a file, or a database on a server. One recording is written at a
+/// time: begin(), remove() for what it replaces, add(), parts of what it measures, finish(). Until
+/// finish() returns, nobody sees any of it. All functions may throw StoreFailure.
 class MeasurementStore {
 public:
-    explicit MeasurementStore(const std::string& file) : _connection(StoreConnection::open(file)) {}
+    virtual ~MeasurementStore() = default;
 
-    StoreConnection& connection() { return *_connection; }
-
-    std::optional<LoadedRecording> withDigest(const std::string& digest);
+    virtual std::optional<LoadedRecording> withDigest(const std::string& digest) = 0;
     /// Those of a technology with that first time.
-    std::vector<LoadedRecording> beginningAt(const std::string& technology, std::int64_t first);
+    virtual std::vector<LoadedRecording> beginningAt(const std::string& technology,
+                                                     std::int64_t first) = 0;
 
-    // Within a transaction.
-
-    /// Its number.
-    std::int64_t add(const LoadedRecording& recording);
-    void setTrouble(std::int64_t recording, const std::string& trouble);
-    void addEvents(std::int64_t recording, const std::vector<Event>& events);
-    void addCells(std::int64_t recording, const std::vector<FoundCell>& cells);
-    /// Removes a recording with everything that it measured.
-    void remove(std::int64_t recording);
-
-private:
-    std::unique_ptr<StoreConnection> _connection;
+    virtual void begin() = 0;
+    /// With finish(), a recording goes with everything that it measured.
+    virtual void remove(const LoadedRecording& recording) = 0;
+    virtual void add(const LoadedRecording& recording) = 0;
+    /// Writes the intervals that the batch keeps, and empties it.
+    virtual void write(IntervalBatch& intervals) = 0;
+    virtual void addEvents(const std::vector<Event>& events) = 0;
+    /// Writes the cells that were found, and the fields of the technology.
+    virtual void addFound(const RecordingMeasurements& measurements) = 0;
+    /// `trouble` is why the recording's end is missing, if it is.
+    virtual void finish(const std::optional<std::string>& trouble) = 0;
+    /// Ends what was begun as if nothing had been written.
+    virtual void abandon() = 0;
 };
 
 } // namespace pallax

@@ -4,8 +4,7 @@
 #include "host/Snapshot.h"
 #include "platform/Bundle.h"
 #include "platform/RecordedTechnology.h"
-#include "store/IntervalWriter.h"
-#include "store/NamedRows.h"
+#include "store/IntervalBatch.h"
 #include "text/Format.h"
 
 #include <bit>
@@ -82,6 +81,9 @@ public:
     Load(const std::string& path, const LoadRequest& request, const StoreDecoder& decoder,
          MeasurementStore& store)
         : _path(path), _request(request), _decoder(decoder), _store(store) {}
+    ~Load() { _store.abandon(); }
+    Load(const Load&) = delete;
+    Load& operator=(const Load&) = delete;
 
     LoadOutcome run();
 
@@ -106,9 +108,8 @@ private:
     Time _first;
     LoadedRecording _recording;
     std::optional<RecordingMeasurements> _measurements;
-    std::optional<IntervalWriter> _intervals;
-    std::optional<StoreConnection::Transaction> _transaction;
-    std::optional<NamedRows> _names;
+    std::optional<IntervalBatch> _intervals;
+    bool _isBegun = false;
     bool _replaces = false;
 };
 
@@ -257,10 +258,10 @@ std::optional<std::string> Load::decode() {
 }
 
 void Load::begin() {
-    if (_transaction) {
+    if (std::exchange(_isBegun, true)) {
         return;
     }
-    _transaction.emplace(_store.connection());
+    _store.begin();
     // Others may have loaded it meanwhile.
     if (auto reason = longerOne()) {
         throw AlreadyThere{std::move(*reason)};
@@ -271,30 +272,23 @@ void Load::begin() {
             before.packets < _recording.packets && haveSameBeginning(_recording, before);
         if (isShorter || before.digest == _recording.digest) {
             _recording.device = before.device;
-            _store.remove(before.id);
+            _store.remove(before);
             _replaces = true;
         }
     }
-    _recording.id = _store.add(_recording);
-    _names.emplace(_store.connection());
+    _store.add(_recording);
 }
 
 void Load::write() {
     begin();
-    _intervals->write(_store.connection(), _recording.id, *_names);
-    _store.addEvents(_recording.id, _measurements->takeEvents());
+    _store.write(*_intervals);
+    _store.addEvents(_measurements->takeEvents());
 }
 
 void Load::finish() {
     write();
-    _store.addCells(_recording.id, _measurements->cells());
-    for (FieldIndex field = 0; field < _measurements->fields().size(); ++field) {
-        (void)_names->field(_measurements->fields()[field]);
-    }
-    if (_recording.trouble) {
-        _store.setTrouble(_recording.id, *_recording.trouble);
-    }
-    _transaction->commit();
+    _store.addFound(*_measurements);
+    _store.finish(_recording.trouble);
 }
 
 } // namespace

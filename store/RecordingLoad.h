@@ -49,7 +49,7 @@ struct StoreDecoder {
     std::span<const Technology> technologies;
 };
 
-/// Brings the recording in a file into a store, in one transaction. The same recording again
+/// Brings the recording in a file into a store, whole or not at all. The same recording again
 /// changes nothing, unless it is to be read otherwise or a newer decoder reads it; a damaged one is
 /// loaded up to where it is whole. StoreFailure leaves.
 LoadOutcome loadRecording(const std::string& path, const LoadRequest& request,

@@ -1,10 +1,11 @@
 #pragma once
 
+#include "store/MeasurementStore.h"
+
 #include <cstdint>
 #include <functional>
 #include <memory>
 #include <optional>
-#include <stdexcept>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -13,12 +14,6 @@ struct sqlite3;
 struct sqlite3_stmt;
 
 namespace pallax {
-
-/// Why a store cannot be read or written: one sentence that names its file.
-class StoreFailure : public std::runtime_error {
-public:
-    using std::runtime_error::runtime_error;
-};
 
 /// A statement of SQL that can run many times. Parameters and columns count from 1 and 0.
 class Statement {

@@ -5,8 +5,10 @@
 #include "host/MonotonicClock.h"
 #include "query/Functions.h"
 #include "querying/QueryRun.h"
+#include "store/StoreConnection.h"
 #include "storing/Loading.h"
 #include "storing/Questions.h"
+#include "storing/ServerAsk.h"
 #include "text/Format.h"
 #include "text/Suggestion.h"
 
@@ -41,14 +43,21 @@ std::vector<std::string> textsOf(Database& database, const std::string& query) {
     }
 }
 
+/// The end of a sentence about an unknown name.
+std::string endOf(const std::string& name, const std::vector<std::string>& names) {
+    const std::string meant = suggestion(name, names);
+    return meant.empty() ? "." : meant;
+}
+
 class Ask {
 public:
-    Ask(const StoreAskOptions& options, const std::string& file, const QualityProfile& profile)
-        : _options(options), _database(file), _profile(profile) {
+    Ask(const StoreAskOptions& options, Database& database, const QualityProfile& profile)
+        : _options(options), _database(database), _profile(profile) {
         addFunctions(_database, installedKnowledge());
     }
 
-    ExitStatus run() {
+    /// `store` has the intervals, if they are not in the database.
+    ExitStatus run(ServerStore* store) {
         if (const auto refusal = findLevels()) {
             complain(*refusal);
             return kExitWrongUsage;
@@ -61,7 +70,9 @@ public:
         const MonotonicClock clock;
         QueryRun run(_database, {_options.timeout},
                      {output, clock, [] {}, [](std::string_view sentence) { complain(sentence); }});
-        return run.run(queryOf(_options, _levels), _options.format);
+        return run.run(store != nullptr ? addServerQuestion(_database, *store, _options, _levels)
+                                        : queryOf(_options, _levels),
+                       _options.format);
     }
 
 private:
@@ -95,8 +106,7 @@ private:
             return formatText("\"%@\" can be %@ or %@.", {name, found[0], found[1]});
         }
         const auto all = textsOf(_database, "SELECT name FROM field");
-        return formatText("No field of the store is named \"%@\"%@.",
-                          {name, suggestion(name, all)});
+        return formatText("No field of the store is named \"%@\"%@", {name, endOf(name, all)});
     }
     std::optional<std::string> unknownDevice() {
         if (!_options.device) {
@@ -107,31 +117,47 @@ private:
             std::find(devices.begin(), devices.end(), *_options.device) != devices.end();
         return isKnown ? std::nullopt
                        : std::optional(
-                             formatText("The store has no device \"%@\"%@.",
-                                        {*_options.device, suggestion(*_options.device, devices)}));
+                             formatText("The store has no device \"%@\"%@",
+                                        {*_options.device, endOf(*_options.device, devices)}));
     }
 
     const StoreAskOptions& _options;
-    Database _database;
+    Database& _database;
     const QualityProfile& _profile;
     std::vector<JudgedLevel> _levels;
 };
 
-} // namespace
-
-ExitStatus runStoreAsk(const StoreAskOptions& options) {
+ExitStatus askFile(const StoreAskOptions& options, const QualityProfile& profile) {
     const std::string file = storeFile(options.store);
     if (const auto refusal = StoreConnection::refusal(file)) {
         complain(*refusal);
         return kExitFailure;
     }
+    Database database(file);
+    return Ask(options, database, profile).run(nullptr);
+}
+
+ExitStatus askAddress(const StoreAskOptions& options, const QualityProfile& profile) {
+    ServerStore store(parseStoreAddress(options.store), patienceOf(options));
+    if (options.question == Question::Sql) {
+        return askServer(store, options);
+    }
+    Database database;
+    addServerTables(database, store, options);
+    return Ask(options, database, profile).run(&store);
+}
+
+} // namespace
+
+ExitStatus runStoreAsk(const StoreAskOptions& options) {
     const auto profile = loadProfile(options.profile, profileFolder());
     if (!profile) {
         complain(profile.error().sentence +
                  (profile.error().isUnknown ? " (see pallax store --help)" : ""));
         return profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
     }
-    return Ask(options, file, *profile).run();
+    return isStoreAddress(options.store) ? askAddress(options, *profile)
+                                         : askFile(options, *profile);
 }
 
 } // namespace pallax

@@ -1,9 +1,11 @@
 #include "storing/Loading.h"
 
 #include "LogGenerator/Technologies/Technologies.h"
+#include "fleet/ServerStore.h"
 #include "host/Sha256.h"
 #include "host/UserFolders.h"
 #include "masking/KeyFile.h"
+#include "store/FileStore.h"
 #include "text/Counted.h"
 #include "text/Format.h"
 
@@ -35,7 +37,9 @@ std::string textOf(const LoadOutcome& outcome, const std::string& path) {
 std::string storeFile(const std::string& url) {
     const auto scheme = url.find("://");
     if (scheme != std::string::npos) {
-        throw StoreFailure(formatText("\"%@\" is no file, and a store is one.", {url}));
+        throw StoreFailure(formatText("\"%@\" is no store: it is neither a file nor "
+                                      "clickhouse://HOST/DATABASE.",
+                                      {url}));
     }
     if (!url.empty()) {
         return url;
@@ -55,8 +59,7 @@ std::string storeFile(const std::string& url) {
 }
 
 Loading::Loading(const LoadingOptions& options)
-    : _options(options), _file(storeFile(options.store)),
-      _resources(DirectoryResources::programFolder()), _identities("left out") {
+    : _options(options), _resources(DirectoryResources::programFolder()), _identities("left out") {
     if (!options.keyFile.empty()) {
         auto key = readKeyFile(options.keyFile);
         if (!key) {
@@ -65,19 +68,34 @@ Loading::Loading(const LoadingOptions& options)
         _identities = "pseudonyms " + nameOfKey(*key);
         _replacements.identities = Replacement(std::move(key).value());
     }
-    const MeasurementStore store(_file); // not kept: other processes may be made
+    // What is opened is not kept: other processes may be made.
+    if (isStoreAddress(options.store)) {
+        _address = parseStoreAddress(options.store);
+        const ServerStore store(*_address);
+    } else {
+        _file = storeFile(options.store);
+        const FileStore store(_file);
+    }
 }
 
-ExitStatus Loading::load(const std::string& path, const Seams& seams) {
-    MeasurementStore store(_file);
+std::unique_ptr<MeasurementStore> Loading::open(const std::string& path, const Seams& seams) const {
+    if (_address) {
+        return std::make_unique<ServerStore>(*_address);
+    }
+    auto store = std::make_unique<FileStore>(_file);
     if (seams.isAlone) {
-        store.connection().setWaiting([&] {
+        store->connection().setWaiting([this, &path, &seams] {
             seams.complain(
                 formatText("%@: another program writes to %@; waiting for it.", {path, _file}));
         });
     }
+    return store;
+}
+
+ExitStatus Loading::load(const std::string& path, const Seams& seams) {
+    const auto store = open(path, seams);
     const LoadOutcome outcome =
-        loadRecording(path, requestOf(seams), {_resources, _bundle, technologies()}, store);
+        loadRecording(path, requestOf(seams), {_resources, _bundle, technologies()}, *store);
     if (outcome.kind == LoadOutcome::Kind::Refused) {
         seams.complain(outcome.reason);
         return kExitFailure;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "decoding/RequiredTemplates.h"
+#include "fleet/StoreAddress.h"
 #include "host/BuildBundle.h"
 #include "masking/PacketMask.h"
 #include "store/RecordingLoad.h"
@@ -36,11 +37,13 @@ public:
     ExitStatus load(const std::string& path, const Seams& seams);
 
 private:
+    std::unique_ptr<MeasurementStore> open(const std::string& path, const Seams& seams) const;
     LoadRequest requestOf(const Seams& seams);
     LoadRequest::Mask maskOf(const RecordedTechnology& technology);
 
     const LoadingOptions& _options;
-    std::string _file;
+    std::string _file; ///< empty if the store is on a server
+    std::optional<StoreAddress> _address;
     RequiredTemplates _resources;
     BuildBundle _bundle;
     Replacements _replacements;

@@ -13,12 +13,6 @@ namespace pallax {
 
 namespace {
 
-std::string numberText(double number) {
-    std::array<char, 40> digits{};
-    const auto end = std::to_chars(digits.data(), digits.data() + digits.size(), number);
-    return {digits.data(), end.ptr};
-}
-
 bool isEndOf(const std::string& words, std::string_view field) {
     return field == words || field.ends_with("." + words);
 }
@@ -43,17 +37,6 @@ std::string onlyDevice(const StoreAskOptions& options) {
     return options.device ? " AND r.device = " + quotedText(*options.device) : "";
 }
 
-/// Where a grade or a better one ends; NULL if there is none.
-std::string borderOf(const JudgedLevel& level, Grade grade) {
-    std::string text = "NULL";
-    for (const Borders::Border& border : level.borders.borders) { // the best first
-        if (border.grade >= grade) {
-            text = numberText(border.value);
-        }
-    }
-    return text;
-}
-
 /// Common tables: `level` has each level with its borders and the sign that makes a greater value
 /// better, `member` its fields.
 std::string levelTables(const std::vector<JudgedLevel>& levels) {
@@ -64,7 +47,7 @@ std::string levelTables(const std::vector<JudgedLevel>& levels) {
         const std::string number = std::to_string(index + 1);
         rows.append(rows.empty() ? "(" : ", (").append(number);
         rows.append(", ").append(quotedText(level.name)).append(", ");
-        rows.append(level.border ? numberText(*level.border) : "NULL");
+        rows.append(level.border ? sqlNumber(*level.border) : "NULL");
         rows.append(level.borders.isSmallerBetter() ? ", -1" : ", 1");
         for (const Grade grade : {Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor}) {
             rows.append(", ").append(borderOf(level, grade));
@@ -102,6 +85,15 @@ constexpr const char* kShareBelow =
 constexpr const char* kQuantiles =
     "summary ->> 3 AS p5, summary ->> 4 AS p50, summary ->> 5 AS p95";
 
+/// Of the table `judged`.
+std::string cellsAnswer() {
+    return formatText("SELECT system, cell, level, devices, %@, border, %@, "
+                      "time_text(summary ->> 2) AS since, %@\n"
+                      "FROM judged WHERE summary ->> 0 > 0\n"
+                      "ORDER BY below_percent DESC, hours DESC, system, cell, level",
+                      {kHours, kShareBelow, kQuantiles});
+}
+
 std::string cellsQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
     return levelTables(levels) +
            formatText("judged AS MATERIALIZED (SELECT p.system, p.identity AS cell, l.level, "
@@ -111,11 +103,7 @@ std::string cellsQuery(const StoreAskOptions& options, const std::vector<JudgedL
                       "FROM sites p CROSS JOIN level l)\n",
                       {onlyDevice(options), kSummary,
                        levelValues(" AND s.site = p.id" + onlyDevice(options))}) +
-           formatText("SELECT system, cell, level, devices, %@, border, %@, "
-                      "time_text(summary ->> 2) AS since, %@\n"
-                      "FROM judged WHERE summary ->> 0 > 0\n"
-                      "ORDER BY below_percent DESC, hours DESC, system, cell, level",
-                      {kHours, kShareBelow, kQuantiles});
+           cellsAnswer();
 }
 
 /// Whether a row is of a device, a recording or a day with this name.
@@ -126,6 +114,23 @@ std::string isOf(const std::string& word, const std::string& milliseconds) {
         return names;
     }
     return formatText("(%@ OR %@ / 86400000 = unixepoch(%@) / 86400)", {names, milliseconds, name});
+}
+
+/// Of the tables `summed` and `happened`, which come before it.
+std::string compareAnswer(const StoreAskOptions& options) {
+    return formatText("name(side, name) AS (VALUES (1, %@), (2, %@)),\n"
+                      "known AS (SELECT side, max(summary ->> 0) / 3.6e6 AS hours FROM summed "
+                      "GROUP BY side),\n",
+                      {quotedText(options.words.at(0)), quotedText(options.words.at(1))}) +
+           formatText("both AS (SELECT n, side, what, %@, %@, %@, NULL AS per_hour, summary ->> 4 "
+                      "AS middle FROM summed WHERE summary ->> 0 > 0\nUNION ALL "
+                      "SELECT 1000, side, kind, round(hours, 3), NULL, NULL, NULL, NULL, "
+                      "round(times / hours, 2), round(times / hours, 2) FROM happened JOIN known "
+                      "USING (side))\n",
+                      {kHours, kShareBelow, kQuantiles}) +
+           "SELECT what, name, hours, below_percent, p5, p50, p95, per_hour, round(middle - "
+           "lag(middle) OVER (PARTITION BY n, what ORDER BY side), 2) AS change\n"
+           "FROM both JOIN name USING (side) ORDER BY n, what, side";
 }
 
 /// Levels, and events by the hour of what was recorded.
@@ -147,19 +152,7 @@ std::string compareQuery(const StoreAskOptions& options, const std::vector<Judge
     return levelTables(levels) +
            formatText("summed AS MATERIALIZED (%@),\nhappened AS MATERIALIZED (%@),\n",
                       {summaries, events}) +
-           formatText("name(side, name) AS (VALUES (1, %@), (2, %@)),\n"
-                      "known AS (SELECT side, max(summary ->> 0) / 3.6e6 AS hours FROM summed "
-                      "GROUP BY side),\n",
-                      {quotedText(options.words.at(0)), quotedText(options.words.at(1))}) +
-           formatText("both AS (SELECT n, side, what, %@, %@, %@, NULL AS per_hour, summary ->> 4 "
-                      "AS middle FROM summed WHERE summary ->> 0 > 0\nUNION ALL "
-                      "SELECT 1000, side, kind, round(hours, 3), NULL, NULL, NULL, NULL, "
-                      "round(times / hours, 2), round(times / hours, 2) FROM happened JOIN known "
-                      "USING (side))\n",
-                      {kHours, kShareBelow, kQuantiles}) +
-           "SELECT what, name, hours, below_percent, p5, p50, p95, per_hour, round(middle - "
-           "lag(middle) OVER (PARTITION BY n, what ORDER BY side), 2) AS change\n"
-           "FROM both JOIN name USING (side) ORDER BY n, what, side";
+           compareAnswer(options);
 }
 
 /// The few intervals that are in several steps are divided where these begin.
@@ -172,11 +165,18 @@ constexpr const char* kSeries =
 held AS (
     SELECT device, entry, step, number, min(stop, (step + 1) * STEP) - start AS hold FROM part
     UNION ALL SELECT device, entry, start / STEP, number, hold
-        FROM VALUES AND start / STEP = (start + hold - 1) / STEP)
-SELECT time_text(step * STEP) AS time, device, entry, min(number) AS least,
-    round(sum(number * hold) / sum(hold), 2) AS mean, max(number) AS greatest,
-    round(100.0 * sum(hold) / STEP, 1) AS known_percent
-FROM held GROUP BY device, entry, step ORDER BY device, entry, step)";
+        FROM VALUES AND start / STEP = (start + hold - 1) / STEP),
+summed AS (
+    SELECT device, entry, step, min(number) AS least, sum(1.0 * number * hold) AS weighted,
+        max(number) AS greatest, sum(hold) AS hold
+        FROM held GROUP BY device, entry, step)
+)";
+
+/// Of the table `summed`.
+constexpr const char* kSeriesAnswer =
+    R"(SELECT time_text(step * STEP) AS time, device, entry, least, round(weighted / hold, 2) AS mean,
+    greatest, round(100.0 * hold / STEP, 1) AS known_percent
+FROM summed ORDER BY device, entry, step)";
 
 /// The text with each such word replaced.
 std::string replaced(std::string_view text, std::string_view word, const std::string& by) {
@@ -188,29 +188,41 @@ std::string replaced(std::string_view text, std::string_view word, const std::st
     return result.append(text);
 }
 
+std::string withStep(const std::string& text, const StoreAskOptions& options) {
+    return replaced(text, "STEP", std::to_string(stepOf(options)));
+}
+
 std::string seriesQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
     const std::string values =
         "measurement WHERE field = " + quotedText(levels.front().fields.front()) +
         " AND number IS NOT NULL AND hold > 0" +
         (options.device ? " AND device = " + quotedText(*options.device) : "") +
         (options.entry ? " AND entry = " + quotedText(*options.entry) : "");
-    const auto step = std::chrono::duration_cast<std::chrono::microseconds>(options.every);
-    return replaced(replaced(kSeries, "STEP", std::to_string(step.count())), "VALUES", values);
+    return withStep(replaced(kSeries, "VALUES", values) + kSeriesAnswer, options);
 }
 
-std::string coverageQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
-    constexpr std::array kGrades{Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor};
-    std::string sums = "sum(hold)";
+constexpr std::array kGrades{Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor};
+
+/// Of the table `judged`.
+std::string coverageAnswer() {
     std::string shares;
     for (std::size_t grade = 0; grade < kGrades.size(); ++grade) {
-        const std::string name(nameOf(kGrades.at(grade)));
-        // Those of this grade or a better one.
-        sums +=
-            formatText(", sum(CASE WHEN number * sign >= %@ * sign THEN hold ELSE 0 END)", {name});
         const std::string better = grade == 0 ? "0" : "(summary ->> " + std::to_string(grade) + ")";
         shares += formatText(", round(100.0 * ((summary ->> %llu) - %@) / (summary ->> 0), 1) "
                              "AS %@",
-                             {std::uint64_t{grade + 1}, better, name});
+                             {std::uint64_t{grade + 1}, better, nameOf(kGrades.at(grade))});
+    }
+    return formatText("SELECT device, level, %@%@, round(100.0 * ((summary ->> 0) - (summary ->> "
+                      "%llu)) / (summary ->> 0), 1) AS none\n"
+                      "FROM judged WHERE summary ->> 0 > 0 ORDER BY device, level",
+                      {kHours, shares, std::uint64_t{kGrades.size()}});
+}
+
+std::string coverageQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+    std::string sums = "sum(hold)";
+    for (const Grade grade : kGrades) { // those of this grade or a better one
+        sums += formatText(", sum(CASE WHEN number * sign >= %@ * sign THEN hold ELSE 0 END)",
+                           {nameOf(grade)});
     }
     return levelTables(levels) +
            formatText("judged AS MATERIALIZED (SELECT d.device, l.level, "
@@ -218,13 +230,26 @@ std::string coverageQuery(const StoreAskOptions& options, const std::vector<Judg
                       "FROM (SELECT DISTINCT device FROM recordings r WHERE true%@) d "
                       "CROSS JOIN level l)\n",
                       {sums, levelValues(" AND r.device = d.device"), onlyDevice(options)}) +
-           formatText("SELECT device, level, %@%@, round(100.0 * ((summary ->> 0) - (summary ->> "
-                      "%llu)) / (summary ->> 0), 1) AS none\n"
-                      "FROM judged WHERE summary ->> 0 > 0 ORDER BY device, level",
-                      {kHours, shares, std::uint64_t{kGrades.size()}});
+           coverageAnswer();
 }
 
 } // namespace
+
+std::string sqlNumber(double number) {
+    std::array<char, 40> digits{};
+    const auto end = std::to_chars(digits.data(), digits.data() + digits.size(), number);
+    return {digits.data(), end.ptr};
+}
+
+std::string borderOf(const JudgedLevel& level, Grade grade) {
+    std::string text = "NULL";
+    for (const Borders::Border& border : level.borders.borders) { // the best first
+        if (border.grade >= grade) {
+            text = sqlNumber(border.value);
+        }
+    }
+    return text;
+}
 
 std::string quotedText(const std::string& text) {
     std::string quoted = "'";
@@ -266,6 +291,25 @@ std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<d
         }
     }
     return levels;
+}
+
+std::int64_t stepOf(const StoreAskOptions& options) {
+    return std::chrono::duration_cast<std::chrono::microseconds>(options.every).count();
+}
+
+std::string answerOf(const StoreAskOptions& options) {
+    switch (options.question) {
+    case StoreAskOptions::Question::Cells:
+        return cellsAnswer();
+    case StoreAskOptions::Question::Series:
+        return withStep(kSeriesAnswer, options);
+    case StoreAskOptions::Question::Compare:
+        return compareAnswer(options);
+    case StoreAskOptions::Question::Coverage:
+        return coverageAnswer();
+    default:
+        return queryOf(options, {}); // of the table `recordings`
+    }
 }
 
 std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {

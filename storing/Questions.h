@@ -4,6 +4,7 @@
 #include "storing/StoreOptions.h"
 #include "text/Result.h"
 
+#include <cstdint>
 #include <optional>
 #include <string>
 #include <vector>
@@ -26,7 +27,21 @@ std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<d
 /// A text as SQL has it.
 std::string quotedText(const std::string& text);
 
+/// As SQL has it.
+std::string sqlNumber(double number);
+
+/// Where a grade or a better one ends; "NULL" if there is none.
+std::string borderOf(const JudgedLevel& level, Grade grade);
+
+/// The length of a step of a series in microseconds.
+std::int64_t stepOf(const StoreAskOptions& options);
+
 /// The query that answers a question, on the views of a store.
 std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels);
+
+/// The last part of that query, which makes the answer of sums that may come from elsewhere: of the
+/// tables `judged` (cells, coverage), `summed` and `happened` (compare), `summed` (series) or
+/// `recordings`.
+std::string answerOf(const StoreAskOptions& options);
 
 } // namespace pallax

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "console/ExitStatus.h"
+#include "fleet/StoreSetup.h"
 #include "knowledge/Quality.h"
 #include "querying/RowWriter.h"
 #include "store/RecordingMeasurements.h"
@@ -14,7 +15,7 @@ namespace pallax {
 
 /// How `pallax store load` and `pallax store watch` bring recordings into a store.
 struct LoadingOptions {
-    std::string store;                      ///< a file; empty: the usual one
+    std::string store;                      ///< a file or an address; empty: the usual file
     std::optional<std::string> device = {}; ///< nothing: the name of a recording's folder
     Resolution resolution = Resolution::Tick;
     std::string keyFile = {}; ///< of pseudonyms; empty: identities are left out
@@ -31,6 +32,12 @@ struct StoreLoadOptions {
 struct StoreWatchOptions {
     LoadingOptions loading = {};
     std::string folder;
+};
+
+/// `pallax store setup`.
+struct StoreSetupOptions {
+    std::string store; ///< an address
+    StoreLayout layout = {};
 };
 
 /// `pallax store query`.
@@ -50,6 +57,9 @@ struct StoreAskOptions {
     RowFormat format = RowFormat::Table;
     std::optional<std::chrono::nanoseconds> timeout = {};
 };
+
+/// Makes the tables of a store on a server.
+ExitStatus runStoreSetup(const StoreSetupOptions& options);
 
 /// Asks a store and writes the rows to standard output. A wrong query is wrong usage.
 ExitStatus runStoreAsk(const StoreAskOptions& options);

@@ -252,7 +252,8 @@ TEST_F(EndToEndStore, WhatIsNoStoreIsToldInASentence) {
     EXPECT_EQ(recording.err, "pallax: " + drive + " is no file of SQLite.\n");
     const Run address = run({"store", "load", "--into", "http://host/db", drive});
     EXPECT_EQ(address.status, 1);
-    EXPECT_EQ(address.err, "pallax: \"http://host/db\" is no file, and a store is one.\n");
+    EXPECT_EQ(address.err, "pallax: \"http://host/db\" is no store: it is neither a file nor "
+                           "clickhouse://HOST/DATABASE.\n");
     const Run folder = run({"store", "load", "--into", world.path("no/such/s.db"), drive});
     EXPECT_EQ(folder.status, 1);
     EXPECT_EQ(folder.err, "pallax: " + world.path("no/such/s.db") +

@@ -142,7 +142,7 @@ TEST_F(RecordingLoadTest, AFullDiskLeavesTheStoreAsItWas) {
     const auto before = content();
     drive(2, std::chrono::seconds(120));
     const std::string path = write("other.pcap");
-    MeasurementStore store(file);
+    FileStore store(file);
     store.connection().run("PRAGMA max_page_count = 1");
     EXPECT_THROW((void)loadRecording(path, request(), {resources, bundle, technologies()}, store),
                  StoreFailure);

@@ -2,6 +2,7 @@
 
 #include "host/RecordingWriter.h"
 #include "query/Functions.h"
+#include "store/FileStore.h"
 #include "store/RecordingLoad.h"
 #include "tests/doubles/Files.h"
 #include "tests/query/QueryFixture.h"
@@ -40,7 +41,7 @@ protected:
         return made;
     }
     LoadOutcome load(const std::string& path, const LoadRequest& wanted) {
-        MeasurementStore store(file);
+        FileStore store(file);
         return loadRecording(path, wanted, {resources, bundle, technologies()}, store);
     }
     LoadOutcome load(const std::string& path) { return load(path, request()); }
