@@ -56,20 +56,16 @@ void appendText(RowBinary& rows, const FieldInfo& field, const FieldValue& value
     rows.add(isNumber ? std::nullopt : value.raw).add(nameOf(standing));
 }
 
-std::int64_t wholeOf(const IntervalBatch::Row& row) {
-    switch (row.part) {
-    case Interval::Part::First:
-        return row.whole;
-    case Interval::Part::Continued:
-        return -1;
-    default:
-        return 0;
-    }
+void appendSeconds(RowBinary& rows, std::int64_t millisecondsOfMinute) {
+    constexpr std::int64_t kSecond = 1000;
+    rows.add(static_cast<std::uint8_t>(millisecondsOfMinute / kSecond));
+    rows.add(static_cast<std::uint16_t>(millisecondsOfMinute % kSecond));
 }
 
-/// A time or a duration as minutes, and the milliseconds of the last one.
-Divided minutesOf(std::int64_t milliseconds) {
-    return divided(milliseconds, kMinute);
+void appendDuration(RowBinary& rows, std::int64_t milliseconds) {
+    const Divided minutes = divided(milliseconds, kMinute);
+    rows.add(static_cast<std::uint32_t>(minutes.quotient));
+    appendSeconds(rows, minutes.rest);
 }
 
 } // namespace
@@ -112,7 +108,7 @@ DecimalText decimalTextOf(double number, std::string_view text) {
 
 void appendInterval(RowBinary& rows, const IntervalBatch::Row& row, IntervalBatch& batch,
                     const LoadedRecording& recording) {
-    constexpr unsigned kLowBits = 16;
+    constexpr unsigned kBits = 8;
     const RecordingMeasurements& measurements = batch.measurements();
     const IntervalBatch::Series& series = batch.series(row);
     const FieldInfo& field = measurements.fields()[series.field];
@@ -125,18 +121,20 @@ void appendInterval(RowBinary& rows, const IntervalBatch::Row& row, IntervalBatc
     } else {
         rows.add("").add("");
     }
-    const Divided time = minutesOf(batch.first().count() + row.time);
+    const Divided time = divided(batch.first().count() + row.time, kMinute);
     const Divided minute = divided(time.quotient, kMinutesOfDay);
-    const Divided hold = minutesOf(row.hold);
     rows.add(static_cast<std::int32_t>(minute.quotient));
-    rows.add(static_cast<std::uint16_t>(minute.rest)).add(static_cast<std::uint16_t>(time.rest));
-    rows.add(static_cast<std::uint32_t>(hold.quotient)).add(static_cast<std::uint16_t>(hold.rest));
-    rows.add(wholeOf(row));
+    rows.add(static_cast<std::uint16_t>(minute.rest));
+    appendSeconds(rows, time.rest);
+    appendDuration(rows, row.hold);
+    rows.add(static_cast<std::uint8_t>(row.part));
+    appendDuration(rows, row.part == Interval::Part::First ? row.whole : 0);
     appendNumber(rows, row.value);
     appendText(rows, field, row.value);
     rows.add(field.unit);
-    rows.add(static_cast<std::uint32_t>(row.packet >> kLowBits));
-    rows.add(static_cast<std::uint16_t>(row.packet));
+    rows.add(static_cast<std::uint16_t>(row.packet >> 2 * kBits));
+    rows.add(static_cast<std::uint8_t>(row.packet >> kBits));
+    rows.add(static_cast<std::uint8_t>(row.packet));
     rows.add(recording.name).add(recording.technology).add(recording.decoder);
 }
 

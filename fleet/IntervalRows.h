@@ -11,9 +11,10 @@ namespace pallax {
 
 /// The columns of `intervals` in the order of appendInterval().
 inline constexpr std::string_view kIntervalColumns =
-    "device, load, month, field, entry, system, cell, day, minute, ms, hold_minutes, hold_ms, "
-    "whole, known, steps, step, rest, decimals, suffix, text, raw, reason, unit, packet_high, "
-    "packet_low, recording, technology, decoder";
+    "device, load, month, field, entry, system, cell, day, minute, second, ms, hold_minutes, "
+    "hold_seconds, hold_ms, part, whole_minutes, whole_seconds, whole_ms, known, steps, step, "
+    "rest, decimals, suffix, text, raw, reason, unit, packet_high, "
+    "packet_middle, packet_low, recording, technology, decoder";
 
 /// 202611, in UTC.
 std::uint32_t monthOf(std::int64_t milliseconds);

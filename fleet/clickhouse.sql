@@ -36,7 +36,8 @@ CREATE TABLE IF NOT EXISTS loads_local (
 
 -- A value for as long as it held, in one serving cell. What is the same in long runs of rows costs
 -- almost nothing, so the names are there in full and no join is needed. What differs from row to row
--- is cut into columns of two bytes, most of which repeat: a day of a device takes a third less space.
+-- is cut into columns of one or two bytes, most of which repeat: without CODEC, a day of a device so
+-- takes little more than half the space.
 --
 -- Partitions are months of the recordings' beginnings, so that one recording is in one partition and
 -- old months can be dropped as a whole. The order is by field first, because questions are about a
@@ -52,11 +53,13 @@ CREATE TABLE IF NOT EXISTS intervals_local (
     cell String,
     day Int32,           -- since 1970
     minute UInt16,       -- of the day
-    ms UInt16,           -- of the minute
+    second UInt8,        -- of the minute
+    ms UInt16,
     hold_minutes UInt32, -- how long it held: whole minutes,
+    hold_seconds UInt8,  -- seconds
     hold_ms UInt16,      -- and milliseconds
-    whole Int64,         -- where cells divide the time of a value: all of its milliseconds in the
-                         -- first part, -1 in the others; 0: it is not divided
+    part UInt8,          -- 0: no cell divides the time of the value; 1: its first part; 2: another
+    whole_minutes UInt32, whole_seconds UInt8, whole_ms UInt16, -- of all parts, in the first one
     known UInt8,         -- 1: it has a number: steps * step + rest
     steps Int16,
     step Float64,
@@ -67,13 +70,12 @@ CREATE TABLE IF NOT EXISTS intervals_local (
     raw Nullable(Int64), -- the number of a label in the record
     reason String,       -- why there is no value; empty: there is one
     unit String,
-    packet_high UInt32,
-    packet_low UInt16,
+    packet_high UInt16, packet_middle UInt8, packet_low UInt8,
     recording String,
     technology String,
     decoder String
 ) ENGINE = MergeTree() PARTITION BY month
-ORDER BY (field, device, load, system, cell, entry, day, minute, ms);
+ORDER BY (field, device, load, system, cell, entry, day, minute, second, ms);
 
 CREATE TABLE IF NOT EXISTS events_local (
     device String, load UInt64, month UInt32, recording String,
@@ -119,8 +121,8 @@ CREATE TABLE IF NOT EXISTS hours_local (
 ORDER BY (field, device, load, system, cell, at_hour);
 
 CREATE MATERIALIZED VIEW IF NOT EXISTS minutes_filled TO minutes_local AS
-WITH (toInt64(day) * 1440 + minute) * 60000 + ms AS since,
-    since + toInt64(hold_minutes) * 60000 + hold_ms AS until,
+WITH (toInt64(day) * 1440 + minute) * 60000 + toInt64(second) * 1000 + ms AS since,
+    since + toInt64(hold_minutes) * 60000 + toInt64(hold_seconds) * 1000 + hold_ms AS until,
     intDiv(since, 60000) + toInt64(arrayJoin(range(toUInt64(
         least(intDiv(until - 1, 60000) - intDiv(since, 60000) + 1, 1440))))) AS piece,
     least(until, piece * 60000 + 60000) - greatest(since, piece * 60000) AS part,
@@ -129,12 +131,12 @@ SELECT field, device, load, month, system, cell, toUInt32(piece) AS at_minute,
     sumState(part) AS held, sumState(number * part) AS weighted,
     minState(toFloat32(number)) AS lowest, maxState(toFloat32(number)) AS highest
 FROM intervals_local
-WHERE known = 1 AND hold_minutes + hold_ms > 0 AND entry = '' AND unit IN ('dBm', 'dB')
+WHERE known = 1 AND hold_minutes + hold_seconds + hold_ms > 0 AND entry = '' AND unit IN ('dBm', 'dB')
 GROUP BY field, device, load, month, system, cell, piece;
 
 CREATE MATERIALIZED VIEW IF NOT EXISTS hours_filled TO hours_local AS
-WITH (toInt64(day) * 1440 + minute) * 60000 + ms AS since,
-    since + toInt64(hold_minutes) * 60000 + hold_ms AS until,
+WITH (toInt64(day) * 1440 + minute) * 60000 + toInt64(second) * 1000 + ms AS since,
+    since + toInt64(hold_minutes) * 60000 + toInt64(hold_seconds) * 1000 + hold_ms AS until,
     intDiv(since, 3600000) + toInt64(arrayJoin(range(toUInt64(
         least(intDiv(until - 1, 3600000) - intDiv(since, 3600000) + 1, 24))))) AS piece,
     least(until, piece * 3600000 + 3600000) - greatest(since, piece * 3600000) AS part,
@@ -143,7 +145,7 @@ SELECT field, device, load, month, system, cell, toUInt32(piece) AS at_hour,
     sumState(part) AS held, sumState(number * part) AS weighted,
     minState(toFloat32(number)) AS lowest, maxState(toFloat32(number)) AS highest
 FROM intervals_local
-WHERE known = 1 AND hold_minutes + hold_ms > 0 AND entry = '' AND unit IN ('dBm', 'dB')
+WHERE known = 1 AND hold_minutes + hold_seconds + hold_ms > 0 AND entry = '' AND unit IN ('dBm', 'dB')
 GROUP BY field, device, load, month, system, cell, piece;
 
 -- The recordings of this shard: the latest load of each. One scan of one table, so a query sees a
@@ -156,16 +158,18 @@ WHERE gone = 0;
 
 -- The current intervals with their times in milliseconds, numbers and texts.
 CREATE VIEW IF NOT EXISTS values_local AS
-SELECT (toInt64(day) * 1440 + minute) * 60000 + ms AS since,
-    toInt64(hold_minutes) * 60000 + hold_ms AS held, whole, field, entry, system, cell,
+SELECT (toInt64(day) * 1440 + minute) * 60000 + toInt64(second) * 1000 + ms AS since,
+    toInt64(hold_minutes) * 60000 + toInt64(hold_seconds) * 1000 + hold_ms AS held, part,
+    toInt64(whole_minutes) * 60000 + toInt64(whole_seconds) * 1000 + whole_ms AS whole, field, entry, system, cell,
     steps * step + rest AS value, if(known = 1, value, NULL) AS number,
     [1, 10, 100, 1000, 10000][greatest(decimals, 0) + 1] AS scale,
     toInt64(round(abs(value) * scale)) AS scaled,
     if(decimals < 0, text, concat(if(value < 0, '-', ''), toString(intDiv(scaled, scale)),
         if(decimals < 1, '', concat('.', substring(toString(scale + scaled % scale), 2))),
         suffix)) AS words,
-    raw, reason, unit, toInt64(packet_high) * 65536 + packet_low AS packet, device, recording,
-    technology, decoder
+    raw, reason, unit,
+    toInt64(packet_high) * 65536 + toInt64(packet_middle) * 256 + packet_low AS packet,
+    device, recording, technology, decoder
 FROM intervals_local
 WHERE load IN (SELECT load FROM recordings_local);
 
@@ -179,9 +183,9 @@ FROM values_local;
 -- As in pallax sql: the time of a value is whole, whichever cells it was in.
 CREATE VIEW IF NOT EXISTS span_local AS
 SELECT since * 1000 AS start, packet, field, nullIf(entry, '') AS entry,
-    if(whole > 0, whole, held) * 1000 AS hold, number, words AS text, unit, device, recording
+    if(part = 1, whole, held) * 1000 AS hold, number, words AS text, unit, device, recording
 FROM values_local
-WHERE whole >= 0;
+WHERE part < 2;
 
 CREATE VIEW IF NOT EXISTS event_local AS
 SELECT time, packet, kind, words, fields, device, recording

@@ -12,10 +12,12 @@ namespace {
 
 // Of a row of `intervals`; see fleet/clickhouse.sql. They are in the query itself, and not in one
 // below it, so that shards send sums and not rows.
-constexpr const char* kSince = "((toInt64(day) * 1440 + minute) * 60000 + ms)";
-constexpr const char* kHeld = "(toInt64(hold_minutes) * 60000 + hold_ms)";
+constexpr const char* kSince =
+    "((toInt64(day) * 1440 + minute) * 60000 + toInt64(second) * 1000 + ms)";
+constexpr const char* kHeld =
+    "(toInt64(hold_minutes) * 60000 + toInt64(hold_seconds) * 1000 + hold_ms)";
 constexpr const char* kValue = "(steps * step + rest)";
-constexpr const char* kCounts = "known = 1 AND hold_minutes + hold_ms > 0";
+constexpr const char* kCounts = "known = 1 AND hold_minutes + hold_seconds + hold_ms > 0";
 
 std::string fieldsOf(const JudgedLevel& level) {
     std::string texts;
