@@ -4,6 +4,8 @@
 #include "text/Format.h"
 
 #include <map>
+#include <set>
+#include <string_view>
 #include <utility>
 
 namespace pallax {
@@ -16,6 +18,7 @@ constexpr const char* kStoreFooter = R"(Examples:
   pallax store watch --into fleet.db arriving
   pallax store query cells --below -110
   pallax store query series measured_rsrp --device car1 --every 1h
+  pallax store query cells --from 2026-11-20T14:00 --to 2026-11-20T15:30
   pallax store query compare 2026-11-20 2026-11-21
   pallax store query --sql "select * from event where kind = 'service-lost'"
 
@@ -51,6 +54,10 @@ which share of that time it was below a border, since when, and the values that
 were not exceeded for 5, 50 and 95 % of the time. The levels are those that the
 status shows; --level takes a field, the end of its name, or a measure (rsrp).
 The border is --below or, by default, where the profile's grade "fair" ends.
+--from and --to limit what cells, series, compare and coverage look at, with
+times as pallax decode takes them: "start" and "end" are those of what the store
+has, of one device with --device. A value counts for the part of its time that
+lies between them.
 
 series FIELD: the course of a field of numbers in steps (--every 1m), for each
 device and list entry: least, mean and greatest value, and for which share of
@@ -113,9 +120,10 @@ void addEvery(CLI::App& app, StoreRequest& request) {
     const auto take = [&request](const std::string& text) {
         if (text == "tick" || text == "packet") {
             request.loading.resolution = text == "tick" ? Resolution::Tick : Resolution::Packet;
-            return;
+        } else {
+            request.asking.every = stepOf(text);
+            request.isStep = true;
         }
-        request.asking.every = stepOf(text);
     };
     app.add_option_function<std::string>(
            "--every", take,
@@ -129,6 +137,8 @@ void addAsking(CLI::App& app, StoreAskOptions& asking) {
         ->type_name("FIELD");
     app.add_option("--below", asking.below, "The border of a bad level (default: of the profile)")
         ->type_name("NUMBER");
+    addTime(app, "--from", asking.from, "Only values from this time on");
+    addTime(app, "--to", asking.to, "Only values up to this time");
     app.add_option("--entry", asking.entry, "Only this list entry of a series")->type_name("WORDS");
     app.add_option("--profile", asking.profile, "The profile that judges levels (default: android)")
         ->type_name("android|field|operator|NAME");
@@ -158,12 +168,59 @@ const std::vector<std::pair<std::string, std::pair<Question, std::size_t>>>& que
     return all;
 }
 
+/// Which actions and questions take an option that not all take.
+struct OptionUse {
+    const char* option;
+    std::set<std::string_view> takers;
+};
+const std::vector<OptionUse>& optionUses() {
+    static const std::set<std::string_view> loading{"load", "watch"};
+    static const std::set<std::string_view> asking{"devices", "recordings", "cells", "series",
+                                                   "compare", "coverage",   "--sql"};
+    static const std::set<std::string_view> measuring{"cells", "series", "compare", "coverage"};
+    static const std::set<std::string_view> judging{"cells", "compare", "coverage"};
+    static const std::vector<OptionUse> all{
+        {"--jobs", {"load"}},
+        {"--pseudonyms", loading},
+        {"--device",
+         {"load", "watch", "devices", "recordings", "cells", "series", "compare", "coverage"}},
+        {"--every", {"load", "watch", "series"}},
+        {"--from", measuring},
+        {"--to", measuring},
+        {"--level", judging},
+        {"--profile", judging},
+        {"--below", {"cells", "compare"}},
+        {"--entry", {"series"}},
+        {"--format", asking},
+        {"--timeout", asking},
+        {"--sql", asking}};
+    return all;
+}
+
+/// Why the options do not fit to an action or question; empty if they do.
+std::string refusalOf(const StoreRequest& request, const std::string& taker) {
+    for (const OptionUse& use : optionUses()) {
+        if (request.app->count(use.option) > 0 && !use.takers.contains(taker)) {
+            return formatText("%@ takes no %@", {taker, use.option});
+        }
+    }
+    if (request.app->count("--every") > 0 && request.isStep != (taker == "series")) {
+        return formatText(
+            "%@: --every takes %@",
+            {taker, taker == "series" ? "a time (30s, 1m, 6h, 1d)" : "tick or packet"});
+    }
+    return "";
+}
+
 ParsedOptions askOptions(const StoreRequest& request) {
     StoreAskOptions asking = request.asking;
     asking.device = request.loading.device;
     asking.store = request.loading.store;
     std::vector<std::string> words = request.words;
     if (request.sql) {
+        if (const std::string refusal = refusalOf(request, "--sql"); !refusal.empty()) {
+            return wrongUsage(refusal, "store");
+        }
         if (words.size() != 1) {
             return wrongUsage("--sql takes one query", "store");
         }
@@ -184,6 +241,9 @@ ParsedOptions askOptions(const StoreRequest& request) {
                                                                         : "two words"}),
                 "store");
         }
+        if (const std::string refusal = refusalOf(request, name); !refusal.empty()) {
+            return wrongUsage(refusal, "store");
+        }
         asking.question = question.first;
         asking.words = words;
         return asking;
@@ -197,6 +257,7 @@ ParsedOptions askOptions(const StoreRequest& request) {
 } // namespace
 
 void addStore(CLI::App& app, StoreRequest& request) {
+    request.app = &app;
     addChoice<StoreRequest::Action>(app, "ACTION", request.action,
                                     {{"load", StoreRequest::Action::Load},
                                      {"query", StoreRequest::Action::Query},
@@ -223,13 +284,18 @@ ParsedOptions storeOptions(const StoreRequest& request) {
     if (request.action == StoreRequest::Action::Query) {
         return askOptions(request);
     }
-    if (request.action == StoreRequest::Action::Load && request.words.empty()) {
+    const bool isWatch = request.action == StoreRequest::Action::Watch;
+    if (const std::string refusal = refusalOf(request, isWatch ? "watch" : "load");
+        !refusal.empty()) {
+        return wrongUsage(refusal, "store");
+    }
+    if (!isWatch && request.words.empty()) {
         return wrongUsage("load takes recordings", "store");
     }
     if (request.loading.device && request.loading.device->empty()) {
         return wrongUsage("a device has a name", "store");
     }
-    if (request.action == StoreRequest::Action::Watch) {
+    if (isWatch) {
         return request.words.size() == 1
                    ? ParsedOptions(StoreWatchOptions{request.loading, request.words.front()})
                    : wrongUsage("watch takes one folder", "store");

@@ -52,6 +52,8 @@ public:
     void setTrouble(std::int64_t recording, const std::string& trouble);
     void addEvents(std::int64_t recording, const std::vector<Event>& events);
     void addCells(std::int64_t recording, const std::vector<FoundCell>& cells);
+    /// Sums up the intervals of levels, which must all be there.
+    void addTotals(std::int64_t recording);
     /// Removes a recording with everything that it measured.
     void remove(std::int64_t recording);
 

@@ -288,6 +288,7 @@ void Load::write() {
 void Load::finish() {
     write();
     _store.addCells(_recording.id, _measurements->cells());
+    _store.addTotals(_recording.id);
     for (FieldIndex field = 0; field < _measurements->fields().size(); ++field) {
         (void)_names->field(_measurements->fields()[field]);
     }

@@ -1,16 +1,24 @@
 #include "console/Output.h"
+#include "decoding/DecodeWindow.h"
 #include "decoding/InstalledKnowledge.h"
+#include "decoding/RequiredTemplates.h"
 #include "host/Complaint.h"
+#include "host/DirectoryResources.h"
 #include "host/KnowledgeFiles.h"
 #include "host/MonotonicClock.h"
+#include "host/WallClock.h"
+#include "platform/RecordedTechnology.h"
 #include "query/Functions.h"
+#include "query/LabelFunction.h"
 #include "querying/QueryRun.h"
 #include "storing/Loading.h"
 #include "storing/Questions.h"
 #include "text/Format.h"
 #include "text/Suggestion.h"
+#include "timeline/FieldTable.h"
 
 #include <algorithm>
+#include <deque>
 #include <unistd.h>
 #include <utility>
 
@@ -20,25 +28,34 @@ namespace {
 
 using Question = StoreAskOptions::Question;
 
-/// The texts of the first column of a query that the program itself asks.
-std::vector<std::string> textsOf(Database& database, const std::string& query) {
+/// The rows of a query that the program itself asks.
+std::vector<std::vector<QueryValue>> rowsOf(Database& database, const std::string& query) {
     auto prepared = database.prepare(query);
     if (!prepared) {
         throw StoreFailure(prepared.error().sentence);
     }
     Query running = std::move(prepared).value();
-    std::vector<std::string> texts;
+    std::vector<std::vector<QueryValue>> rows;
     while (true) {
         auto row = running.next();
         if (!row) {
             throw StoreFailure(row.error().sentence);
         }
         if (!*row) {
-            return texts;
+            return rows;
         }
-        const auto* text = std::get_if<std::string>(&(**row).front());
+        rows.push_back(**row);
+    }
+}
+
+/// The texts of the first column.
+std::vector<std::string> textsOf(Database& database, const std::string& query) {
+    std::vector<std::string> texts;
+    for (const std::vector<QueryValue>& row : rowsOf(database, query)) {
+        const auto* text = std::get_if<std::string>(&row.front());
         texts.push_back(text != nullptr ? *text : "");
     }
+    return texts;
 }
 
 class Ask {
@@ -46,6 +63,7 @@ public:
     Ask(const StoreAskOptions& options, const std::string& file, const QualityProfile& profile)
         : _options(options), _database(file), _profile(profile) {
         addFunctions(_database, installedKnowledge());
+        addLabels();
     }
 
     ExitStatus run() {
@@ -57,11 +75,16 @@ public:
             complain(*refusal);
             return kExitFailure;
         }
+        const auto time = findTime();
+        if (!time) {
+            complain(time.error());
+            return kExitFailure;
+        }
         Output output(writeToDescriptor(STDOUT_FILENO, "Standard output"));
         const MonotonicClock clock;
         QueryRun run(_database, {_options.timeout},
                      {output, clock, [] {}, [](std::string_view sentence) { complain(sentence); }});
-        return run.run(queryOf(_options, _levels), _options.format);
+        return run.run(queryOf(_options, _levels, *time), _options.format);
     }
 
 private:
@@ -111,7 +134,61 @@ private:
                                         {*_options.device, suggestion(*_options.device, devices)}));
     }
 
+    /// Of the technologies that the store has.
+    void addLabels() {
+        if (_options.question != Question::Sql) {
+            return;
+        }
+        std::vector<const FieldTable*> tables;
+        for (const std::string& name :
+             textsOf(_database, "SELECT DISTINCT technology FROM recordings ORDER BY 1")) {
+            if (const RecordedTechnology* technology = technologyOfCommandName(name)) {
+                tables.push_back(&_fields.emplace_back(*technology, _resources));
+            }
+        }
+        if (!tables.empty()) {
+            addLabelFunction(_database, std::move(tables));
+        }
+    }
+
+    /// Of the recordings that the question is about.
+    Result<AskedTime, std::string> findTime() {
+        DecodeWindow window({_options.from, _options.to});
+        if (window.isOpen()) {
+            return AskedTime();
+        }
+        const auto rows =
+            rowsOf(_database,
+                   "SELECT min(first), max(last) FROM recordings" +
+                       (_options.device ? " WHERE device = " + quotedText(*_options.device) : ""));
+        const auto* first = std::get_if<std::int64_t>(&rows.front()[0]);
+        const auto* last = std::get_if<std::int64_t>(&rows.front()[1]);
+        if (first == nullptr || last == nullptr) {
+            return AskedTime(); // nothing is there
+        }
+        using std::chrono::milliseconds;
+        const TimeSpan span{Time(milliseconds(*first)), Time(milliseconds(*last))};
+        const WallClock zone;
+        if (const auto refusal =
+                window.open(span, [&zone](Time time) { return zone.zone(time).offset; })) {
+            return *refusal;
+        }
+        const auto inMilliseconds = [](Time time) {
+            return std::chrono::floor<milliseconds>(time.time_since_epoch()).count();
+        };
+        AskedTime asked;
+        if (_options.from) {
+            asked.from = inMilliseconds(window.from());
+        }
+        if (_options.to) {
+            asked.to = inMilliseconds(window.to());
+        }
+        return asked;
+    }
+
     const StoreAskOptions& _options;
+    RequiredTemplates _resources{DirectoryResources::programFolder()};
+    std::deque<FieldTable> _fields; // outlive the database
     Database _database;
     const QualityProfile& _profile;
     std::vector<JudgedLevel> _levels;

@@ -80,38 +80,74 @@ std::string levelTables(const std::vector<JudgedLevel>& levels) {
            "),\nmember AS (SELECT n, id AS field FROM named JOIN fields USING (name)),\n";
 }
 
-/// The values of the current level that a condition leaves.
-std::string levelValues(const std::string& condition) {
-    return "FROM (SELECT i.hold, CASE typeof(i.number) WHEN 'integer' THEN i.number * s.step ELSE "
-           "i.number END AS number, (r.first + i.time) * 1000 AS start\n"
-           "FROM member m CROSS JOIN series s ON s.field = m.field "
-           "CROSS JOIN recordings r ON r.id = s.recording "
-           "CROSS JOIN intervals i ON i.id BETWEEN s.first_row AND s.last_row\n"
-           "WHERE m.n = l.n AND i.number IS NOT NULL AND i.hold > 0" +
-           condition + ")";
+/// The part of an interval that is in the asked time.
+struct Clipped {
+    /// `start` and `end` are expressions in units of which a millisecond has `unit`.
+    Clipped(const AskedTime& time, std::string itsStart, std::string itsEnd, std::int64_t unit)
+        : start(std::move(itsStart)), end(std::move(itsEnd)) {
+        if (time.from) {
+            const std::string from = std::to_string(*time.from * unit);
+            condition += formatText(" AND %@ > %@", {end, from});
+            start = formatText("max(%@, %@)", {start, from});
+        }
+        if (time.to) {
+            const std::string to = std::to_string(*time.to * unit);
+            condition += formatText(" AND %@ < %@", {start, to});
+            end = formatText("min(%@, %@)", {end, to});
+        }
+    }
+
+    std::string start;
+    std::string end;
+    std::string condition = {}; ///< " AND …": whether there is a part
+};
+
+/// The values of the current level that a condition on recordings `r` and sites `s.site` leaves.
+std::string levelValues(const std::string& condition, const AskedTime& time) {
+    const Clipped part(time, "(r.first + i.time)", "(r.first + i.time + i.hold)", 1);
+    const Clipped series(time, "(r.first + s.first)", "(r.first + s.last)", 1);
+    return formatText(
+        "FROM (SELECT %@ - %@ AS hold, CASE typeof(i.number) WHEN 'integer' THEN "
+        "i.number * s.step ELSE i.number END AS number, %@ * 1000 AS start, "
+        "r.device\n"
+        "FROM member m CROSS JOIN series s ON s.field = m.field "
+        "CROSS JOIN recordings r ON r.id = s.recording "
+        "CROSS JOIN intervals i ON i.id BETWEEN s.first_row AND s.last_row\n"
+        "WHERE m.n = l.n AND i.number IS NOT NULL AND i.hold > 0%@%@%@)",
+        {part.end, part.start, part.start, series.condition, part.condition, condition});
+}
+
+/// The same for questions that do not look at times within recordings: of all times, each number
+/// is one row.
+std::string levelTotals(const std::string& condition, const AskedTime& time) {
+    return !time.isAll()
+               ? levelValues(condition, time)
+               : "FROM (SELECT s.hold, s.number, (r.first + s.first) * 1000 AS start, r.device\n"
+                 "FROM member m CROSS JOIN totals s ON s.field = m.field "
+                 "CROSS JOIN recordings r ON r.id = s.recording WHERE m.n = l.n" +
+                     condition + ")";
 }
 
 // Several sums of one pass over the values, as elements of a JSON array.
 constexpr const char* kSummary =
     "SELECT json_array(sum(hold), sum(CASE WHEN number * sign < border * sign THEN hold ELSE 0 "
     "END), min(CASE WHEN number * sign < border * sign THEN start END), "
-    "quantile(number, hold, 0.05), quantile(number, hold, 0.5), quantile(number, hold, 0.95))\n";
+    "quantile(number, hold, 0.05), quantile(number, hold, 0.5), quantile(number, hold, 0.95), "
+    "count(DISTINCT device))\n";
 constexpr const char* kHours = "round((summary ->> 0) / 3.6e6, 3) AS hours";
 constexpr const char* kShareBelow =
     "round(100.0 * (summary ->> 1) / (summary ->> 0), 1) AS below_percent";
 constexpr const char* kQuantiles =
     "summary ->> 3 AS p5, summary ->> 4 AS p50, summary ->> 5 AS p95";
 
-std::string cellsQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+std::string cellsQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                       const AskedTime& time) {
     return levelTables(levels) +
            formatText("judged AS MATERIALIZED (SELECT p.system, p.identity AS cell, l.level, "
-                      "l.border, (SELECT count(DISTINCT r.device) FROM member m JOIN series s ON "
-                      "s.site = p.id AND s.field = m.field JOIN recordings r ON r.id = s.recording "
-                      "WHERE m.n = l.n%@) AS devices,\n(%@%@) AS summary\n"
+                      "l.border, (%@%@) AS summary\n"
                       "FROM sites p CROSS JOIN level l)\n",
-                      {onlyDevice(options), kSummary,
-                       levelValues(" AND s.site = p.id" + onlyDevice(options))}) +
-           formatText("SELECT system, cell, level, devices, %@, border, %@, "
+                      {kSummary, levelTotals(" AND s.site = p.id" + onlyDevice(options), time)}) +
+           formatText("SELECT system, cell, level, summary ->> 6 AS devices, %@, border, %@, "
                       "time_text(summary ->> 2) AS since, %@\n"
                       "FROM judged WHERE summary ->> 0 > 0\n"
                       "ORDER BY below_percent DESC, hours DESC, system, cell, level",
@@ -129,7 +165,8 @@ std::string isOf(const std::string& word, const std::string& milliseconds) {
 }
 
 /// Levels, and events by the hour of what was recorded.
-std::string compareQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+std::string compareQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                         const AskedTime& time) {
     std::string summaries;
     std::string events;
     for (std::size_t side = 0; side < options.words.size(); ++side) {
@@ -138,10 +175,11 @@ std::string compareQuery(const StoreAskOptions& options, const std::vector<Judge
         summaries += formatText(
             "%@SELECT l.n, %@ AS side, l.level AS what, (%@%@) AS summary FROM level l",
             {side == 0 ? "" : " UNION ALL ", number, kSummary,
-             levelValues(" AND " + isOf(word, "(r.first + i.time)") + onlyDevice(options))});
+             levelValues(" AND " + isOf(word, "(r.first + i.time)") + onlyDevice(options), time)});
         events += formatText("%@SELECT %@ AS side, kind, count(*) AS times FROM recordings r JOIN "
-                             "events e ON e.recording = r.id WHERE %@%@ GROUP BY kind",
+                             "events e ON e.recording = r.id WHERE %@%@%@ GROUP BY kind",
                              {side == 0 ? "" : " UNION ALL ", number, isOf(word, "e.time / 1000"),
+                              Clipped(time, "(e.time / 1000)", "(e.time / 1000 + 1)", 1).condition,
                               onlyDevice(options)});
     }
     return levelTables(levels) +
@@ -188,17 +226,22 @@ std::string replaced(std::string_view text, std::string_view word, const std::st
     return result.append(text);
 }
 
-std::string seriesQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
-    const std::string values =
-        "measurement WHERE field = " + quotedText(levels.front().fields.front()) +
-        " AND number IS NOT NULL AND hold > 0" +
-        (options.device ? " AND device = " + quotedText(*options.device) : "") +
-        (options.entry ? " AND entry = " + quotedText(*options.entry) : "");
+std::string seriesQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                        const AskedTime& time) {
+    constexpr std::int64_t kMicroseconds = 1000;
+    const Clipped part(time, "start", "(start + hold)", kMicroseconds);
+    const std::string values = formatText(
+        "(SELECT device, entry, %@ AS start, %@ - %@ AS hold, number FROM measurement WHERE field "
+        "= %@ AND number IS NOT NULL AND hold > 0%@%@%@) WHERE true",
+        {part.start, part.end, part.start, quotedText(levels.front().fields.front()),
+         part.condition, options.device ? " AND device = " + quotedText(*options.device) : "",
+         options.entry ? " AND entry = " + quotedText(*options.entry) : ""});
     const auto step = std::chrono::duration_cast<std::chrono::microseconds>(options.every);
     return replaced(replaced(kSeries, "STEP", std::to_string(step.count())), "VALUES", values);
 }
 
-std::string coverageQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+std::string coverageQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                          const AskedTime& time) {
     constexpr std::array kGrades{Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor};
     std::string sums = "sum(hold)";
     std::string shares;
@@ -217,7 +260,7 @@ std::string coverageQuery(const StoreAskOptions& options, const std::vector<Judg
                       "(SELECT json_array(%@)\n%@) AS summary\n"
                       "FROM (SELECT DISTINCT device FROM recordings r WHERE true%@) d "
                       "CROSS JOIN level l)\n",
-                      {sums, levelValues(" AND r.device = d.device"), onlyDevice(options)}) +
+                      {sums, levelTotals(" AND r.device = d.device", time), onlyDevice(options)}) +
            formatText("SELECT device, level, %@%@, round(100.0 * ((summary ->> 0) - (summary ->> "
                       "%llu)) / (summary ->> 0), 1) AS none\n"
                       "FROM judged WHERE summary ->> 0 > 0 ORDER BY device, level",
@@ -268,7 +311,8 @@ std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<d
     return levels;
 }
 
-std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                    const AskedTime& time) {
     switch (options.question) {
     case StoreAskOptions::Question::Devices:
         return "SELECT device, count(*) AS recordings, time_text(min(first) * 1000) AS first, "
@@ -281,13 +325,13 @@ std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLeve
                "FROM recordings r WHERE true" +
                onlyDevice(options) + " ORDER BY device, first, name";
     case StoreAskOptions::Question::Cells:
-        return cellsQuery(options, levels);
+        return cellsQuery(options, levels, time);
     case StoreAskOptions::Question::Series:
-        return seriesQuery(options, levels);
+        return seriesQuery(options, levels, time);
     case StoreAskOptions::Question::Compare:
-        return compareQuery(options, levels);
+        return compareQuery(options, levels, time);
     case StoreAskOptions::Question::Coverage:
-        return coverageQuery(options, levels);
+        return coverageQuery(options, levels, time);
     case StoreAskOptions::Question::Sql:
         break;
     }

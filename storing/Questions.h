@@ -4,6 +4,7 @@
 #include "storing/StoreOptions.h"
 #include "text/Result.h"
 
+#include <cstdint>
 #include <optional>
 #include <string>
 #include <vector>
@@ -26,7 +27,16 @@ std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<d
 /// A text as SQL has it.
 std::string quotedText(const std::string& text);
 
-/// The query that answers a question, on the views of a store.
-std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels);
+/// The times that a question is about, in milliseconds since 1970. Nothing: all times.
+struct AskedTime {
+    std::optional<std::int64_t> from = {};
+    std::optional<std::int64_t> to = {};
+
+    bool isAll() const { return !from && !to; }
+};
+
+/// The query that answers a question, on the tables and views of a store.
+std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                    const AskedTime& time);
 
 } // namespace pallax

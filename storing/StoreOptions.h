@@ -4,6 +4,7 @@
 #include "knowledge/Quality.h"
 #include "querying/RowWriter.h"
 #include "store/RecordingMeasurements.h"
+#include "text/TimeText.h"
 
 #include <chrono>
 #include <optional>
@@ -47,6 +48,8 @@ struct StoreAskOptions {
     std::string profile{kDefaultProfile};
     std::chrono::nanoseconds every = std::chrono::minutes(1); ///< of a series
     std::optional<std::string> entry = {};                    ///< of a series
+    std::optional<TimeText> from = {}; ///< of what the store has, of the device if there is one
+    std::optional<TimeText> to = {};
     RowFormat format = RowFormat::Table;
     std::optional<std::chrono::nanoseconds> timeout = {};
 };

@@ -57,6 +57,43 @@ TEST(StoreOptions, QueryTakesAQuestion) {
     EXPECT_EQ(sql.words, std::vector<std::string>{"select 1"});
 }
 
+TEST(StoreOptions, TimesLimitQuestions) {
+    for (const char* question : {"cells", "coverage"}) {
+        const auto limited = parsed<StoreAskOptions>(
+            {"store", "query", question, "--from", "2026-11-20T14:00Z", "--to", "end"});
+        EXPECT_TRUE(limited.from && limited.from->isAbsolute());
+        EXPECT_TRUE(limited.to && limited.to->isEnd());
+    }
+    EXPECT_EQ(refusal({"store", "query", "cells", "--from", "noon"}).substr(0, 23),
+              "pallax: --from: \"noon\" ");
+}
+
+TEST(StoreOptions, WhatAnActionDoesNotTakeIsRefused) {
+    const auto says = [](std::vector<std::string> arguments, const std::string& expected) {
+        arguments.insert(arguments.begin(), "store");
+        EXPECT_EQ(refusal(std::move(arguments)),
+                  "pallax: " + expected + " (see pallax store --help)\n");
+    };
+    says({"load", "a", "--format", "csv"}, "load takes no --format");
+    says({"load", "a", "--below", "-110"}, "load takes no --below");
+    says({"load", "a", "--from", "start"}, "load takes no --from");
+    says({"load", "a", "--sql"}, "load takes no --sql");
+    says({"load", "a", "--every", "1m"}, "load: --every takes tick or packet");
+    says({"watch", "a", "--jobs", "2"}, "watch takes no --jobs");
+    says({"watch", "a", "--timeout", "2"}, "watch takes no --timeout");
+    says({"query", "devices", "--jobs", "2"}, "devices takes no --jobs");
+    says({"query", "devices", "--to", "end"}, "devices takes no --to");
+    says({"query", "recordings", "--profile", "field"}, "recordings takes no --profile");
+    says({"query", "cells", "--pseudonyms", "key"}, "cells takes no --pseudonyms");
+    says({"query", "cells", "--entry", "PCI 1"}, "cells takes no --entry");
+    says({"query", "cells", "--every", "1m"}, "cells takes no --every");
+    says({"query", "series", "rsrp", "--every", "packet"},
+         "series: --every takes a time (30s, 1m, 6h, 1d)");
+    says({"query", "series", "rsrp", "--level", "rsrp"}, "series takes no --level");
+    says({"query", "coverage", "--below", "-110"}, "coverage takes no --below");
+    says({"query", "--sql", "select 1", "--device", "car1"}, "--sql takes no --device");
+}
+
 TEST(StoreOptions, WatchTakesAFolder) {
     const auto watch = parsed<StoreWatchOptions>({"store", "watch", "--into", "s.db", "arriving"});
     EXPECT_EQ(watch.folder, "arriving");
