@@ -54,14 +54,18 @@ which share of that time it was below a border, since when, and the values that
 were not exceeded for 5, 50 and 95 % of the time. The levels are those that the
 status shows; --level takes a field, the end of its name, or a measure (rsrp).
 The border is --below or, by default, where the profile's grade "fair" ends.
---from and --to limit what cells, series, compare and coverage look at, with
-times as pallax decode takes them: "start" and "end" are those of what the store
-has, of one device with --device. A value counts for the part of its time that
-lies between them.
+--from and --to limit what cells, series, section, compare and coverage look at,
+with times as pallax decode takes them: "start" and "end" are those of what the
+store has, of one device with --device. A value counts for the part of its time
+that lies between them; a section has the rows that begin there.
 
 series FIELD: the course of a field of numbers in steps (--every 1m), for each
 device and list entry: least, mean and greatest value, and for which share of
 the step it was known.
+
+section NAME: what a section of the display showed (serving_cell_measurements),
+or a list in it (neighbor_cells_list): a row for each time in which nothing of
+it changed, with a column for each field.
 
 compare A B: the levels of two devices, recordings or days (2026-11-20, in UTC),
 and the events of each kind per hour.
@@ -70,9 +74,9 @@ coverage: for each device and level, for which share of the time it had each
 grade of the profile.
 
 --sql: a query on the views span, event, cell and field, which are those of
-pallax-sql(7) with the columns device and recording; on measurement, which
-also tells the serving cell; or on the tables of the file, which sqlite3 opens,
-too. Times of values are in whole milliseconds.
+pallax-sql(7) with the columns device and recording, as are the tables of the
+sections; on measurement, which also tells the serving cell; or on the tables of
+the file, which sqlite3 opens, too. Times of values are in whole milliseconds.
 
 Exit status:
   0   success, or the reader of the output has gone
@@ -139,7 +143,8 @@ void addAsking(CLI::App& app, StoreAskOptions& asking) {
         ->type_name("NUMBER");
     addTime(app, "--from", asking.from, "Only values from this time on");
     addTime(app, "--to", asking.to, "Only values up to this time");
-    app.add_option("--entry", asking.entry, "Only this list entry of a series")->type_name("WORDS");
+    app.add_option("--entry", asking.entry, "Only this list entry of a series or section")
+        ->type_name("WORDS");
     app.add_option("--profile", asking.profile, "The profile that judges levels (default: android)")
         ->type_name("android|field|operator|NAME");
     addChoice<RowFormat>(
@@ -162,9 +167,10 @@ void addAsking(CLI::App& app, StoreAskOptions& asking) {
 /// The question of the first word, and how many words follow it.
 const std::vector<std::pair<std::string, std::pair<Question, std::size_t>>>& questions() {
     static const std::vector<std::pair<std::string, std::pair<Question, std::size_t>>> all{
-        {"devices", {Question::Devices, 0}}, {"recordings", {Question::Recordings, 0}},
-        {"cells", {Question::Cells, 0}},     {"series", {Question::Series, 1}},
-        {"compare", {Question::Compare, 2}}, {"coverage", {Question::Coverage, 0}}};
+        {"devices", {Question::Devices, 0}},  {"recordings", {Question::Recordings, 0}},
+        {"cells", {Question::Cells, 0}},      {"series", {Question::Series, 1}},
+        {"section", {Question::Section, 1}},  {"compare", {Question::Compare, 2}},
+        {"coverage", {Question::Coverage, 0}}};
     return all;
 }
 
@@ -175,25 +181,26 @@ struct OptionUse {
 };
 const std::vector<OptionUse>& optionUses() {
     static const std::set<std::string_view> loading{"load", "watch"};
-    static const std::set<std::string_view> asking{"devices", "recordings", "cells", "series",
-                                                   "compare", "coverage",   "--sql"};
-    static const std::set<std::string_view> measuring{"cells", "series", "compare", "coverage"};
+    static const std::set<std::string_view> asking{"devices", "recordings", "cells",    "series",
+                                                   "section", "compare",    "coverage", "--sql"};
+    static const std::set<std::string_view> measuring{"cells", "series", "section", "compare",
+                                                      "coverage"};
     static const std::set<std::string_view> judging{"cells", "compare", "coverage"};
-    static const std::vector<OptionUse> all{
-        {"--jobs", {"load"}},
-        {"--pseudonyms", loading},
-        {"--device",
-         {"load", "watch", "devices", "recordings", "cells", "series", "compare", "coverage"}},
-        {"--every", {"load", "watch", "series"}},
-        {"--from", measuring},
-        {"--to", measuring},
-        {"--level", judging},
-        {"--profile", judging},
-        {"--below", {"cells", "compare"}},
-        {"--entry", {"series"}},
-        {"--format", asking},
-        {"--timeout", asking},
-        {"--sql", asking}};
+    static const std::vector<OptionUse> all{{"--jobs", {"load"}},
+                                            {"--pseudonyms", loading},
+                                            {"--device",
+                                             {"load", "watch", "devices", "recordings", "cells",
+                                              "series", "section", "compare", "coverage"}},
+                                            {"--every", {"load", "watch", "series"}},
+                                            {"--from", measuring},
+                                            {"--to", measuring},
+                                            {"--level", judging},
+                                            {"--profile", judging},
+                                            {"--below", {"cells", "compare"}},
+                                            {"--entry", {"series", "section"}},
+                                            {"--format", asking},
+                                            {"--timeout", asking},
+                                            {"--sql", asking}};
     return all;
 }
 
@@ -237,8 +244,9 @@ ParsedOptions askOptions(const StoreRequest& request) {
         if (words.size() != question.second) {
             return wrongUsage(
                 formatText("%@ takes %@", {name, question.second == 0   ? "no words"
-                                                 : question.second == 1 ? "a field"
-                                                                        : "two words"}),
+                                                 : question.second == 2 ? "two words"
+                                                 : name == "series"     ? "a field"
+                                                                        : "the name of a section"}),
                 "store");
         }
         if (const std::string refusal = refusalOf(request, name); !refusal.empty()) {
@@ -264,11 +272,11 @@ void addStore(CLI::App& app, StoreRequest& request) {
                                      {"watch", StoreRequest::Action::Watch}},
                                     "What to do")
         ->required();
-    app.add_option(
-           "WORDS", request.words,
-           "The recordings to load (pcap or pcapng), or a question: devices, recordings, "
-           "cells, series FIELD, compare A B, coverage or, with --sql, a query; or the folder to "
-           "watch")
+    app.add_option("WORDS", request.words,
+                   "The recordings to load (pcap or pcapng), or a question: devices, recordings, "
+                   "cells, series FIELD, section NAME, compare A B, coverage or, with --sql, a "
+                   "query; or the "
+                   "folder to watch")
         ->type_name("");
     app.add_option("--into,--store", request.loading.store,
                    "The file of the store (default: measurements.db in the folder for data)")

@@ -231,6 +231,7 @@ Database::~Database() = default;
 void Database::add(const std::string& schema, const std::string& name,
                    std::unique_ptr<QueryTable> table) {
     sqlite3_set_authorizer(_connection.get(), nullptr, nullptr);
+    run(*_connection, "PRAGMA query_only = false");
     if (std::find(_schemas.begin(), _schemas.end(), schema) == _schemas.end()) {
         run(*_connection, "ATTACH ':memory:' AS \"" + schema + "\"");
         _schemas.push_back(schema);
@@ -245,6 +246,7 @@ void Database::add(const std::string& schema, const std::string& name,
     if (!addVirtualTable(*_connection, qualified.c_str(), *_added.back())) {
         throw std::runtime_error(sqlite3_errmsg(_connection.get()));
     }
+    run(*_connection, "PRAGMA query_only = true");
 }
 
 std::vector<Database::Table> Database::tables() const {

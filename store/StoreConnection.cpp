@@ -155,6 +155,14 @@ std::string Statement::text(int column) const {
                : std::string();
 }
 
+double Statement::real(int column) const {
+    return sqlite3_column_double(_statement.get(), column);
+}
+
+bool Statement::isInteger(int column) const {
+    return sqlite3_column_type(_statement.get(), column) == SQLITE_INTEGER;
+}
+
 bool Statement::isNull(int column) const {
     return sqlite3_column_type(_statement.get(), column) == SQLITE_NULL;
 }
@@ -214,13 +222,21 @@ std::unique_ptr<StoreConnection> StoreConnection::open(const std::string& file) 
     return whenFree([&] { return std::unique_ptr<StoreConnection>(new StoreConnection(file)); });
 }
 
-std::optional<std::string> StoreConnection::refusal(const std::string& file) {
+std::unique_ptr<StoreConnection> StoreConnection::openToRead(const std::string& file) {
     std::error_code ignored;
     if (!std::filesystem::exists(file, ignored)) {
-        return formatText("There is no store %@ (see pallax store load).", {file});
+        throw StoreFailure(formatText("There is no store %@ (see pallax store load).", {file}));
     }
+    return whenFree([&] {
+        std::unique_ptr<StoreConnection> store(new StoreConnection(file, Mode::Read));
+        store->check(Empty::Refused);
+        return store;
+    });
+}
+
+std::optional<std::string> StoreConnection::refusal(const std::string& file) {
     try {
-        whenFree([&] { StoreConnection(file, Mode::Read).check(Empty::Refused); });
+        (void)openToRead(file);
     } catch (const StoreFailure& failure) {
         return failure.what();
     }

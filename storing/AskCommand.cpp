@@ -10,7 +10,9 @@
 #include "platform/RecordedTechnology.h"
 #include "query/Functions.h"
 #include "query/LabelFunction.h"
+#include "query/QueryTable.h"
 #include "querying/QueryRun.h"
+#include "store/StoredSections.h"
 #include "storing/Loading.h"
 #include "storing/Questions.h"
 #include "text/Format.h"
@@ -58,12 +60,19 @@ std::vector<std::string> textsOf(Database& database, const std::string& query) {
     return texts;
 }
 
+/// "No field of the store is named "rspr". Did you mean "rsrp"?"
+std::string unknown(const std::string& sentence, const std::string& name,
+                    const std::vector<std::string>& names) {
+    const std::string meant = suggestion(name, names);
+    return formatText(sentence, {name}) + (meant.empty() ? "." : meant);
+}
+
 class Ask {
 public:
     Ask(const StoreAskOptions& options, const std::string& file, const QualityProfile& profile)
-        : _options(options), _database(file), _profile(profile) {
+        : _options(options), _file(file), _database(file), _profile(profile) {
         addFunctions(_database, installedKnowledge());
-        addLabels();
+        addTechnologies();
     }
 
     ExitStatus run() {
@@ -84,7 +93,10 @@ public:
         const MonotonicClock clock;
         QueryRun run(_database, {_options.timeout},
                      {output, clock, [] {}, [](std::string_view sentence) { complain(sentence); }});
-        return run.run(queryOf(_options, _levels, *time), _options.format);
+        return run.run(_options.question == Question::Section
+                           ? sectionQuery(_options, _section, *time)
+                           : queryOf(_options, _levels, *time),
+                       _options.format);
     }
 
 private:
@@ -92,6 +104,9 @@ private:
     std::optional<std::string> findLevels() {
         if (_options.question == Question::Series) {
             return findField(_options.words.front());
+        }
+        if (_options.question == Question::Section) {
+            return findSection(_options.words.front());
         }
         _levels = judgedLevels(_options.levels, _options.below, _profile);
         return _levels.empty()
@@ -118,8 +133,36 @@ private:
             return formatText("\"%@\" can be %@ or %@.", {name, found[0], found[1]});
         }
         const auto all = textsOf(_database, "SELECT name FROM field");
-        return formatText("No field of the store is named \"%@\"%@.",
-                          {name, suggestion(name, all)});
+        return unknown("No field of the store is named \"%@\"", name, all);
+    }
+    std::optional<std::string> findSection(const std::string& name) {
+        std::vector<std::string> found;
+        std::vector<std::string> all;
+        for (const Database::Table& table : _database.tables()) {
+            const std::string full = table.schema + "." + table.name;
+            all.insert(all.end(), {full, table.name});
+            if (name == full || name == table.name) {
+                found.push_back(full);
+                _section = sectionOf(table);
+            }
+        }
+        if (found.size() > 1) {
+            return formatText("\"%@\" can be %@ or %@.", {name, found[0], found[1]});
+        }
+        return !found.empty()
+                   ? std::nullopt
+                   : std::optional(unknown("No section of the store is named \"%@\"", name, all));
+    }
+    static AskedSection sectionOf(const Database::Table& table) {
+        AskedSection section;
+        section.table = table.schema + ".\"" + table.name + "\"";
+        for (const Column& column : table.columns) {
+            section.isList = section.isList || (column.name == "entry" && !column.isHidden);
+            if (column.role == Column::Role::Value) {
+                section.fields.push_back(column.name);
+            }
+        }
+        return section;
     }
     std::optional<std::string> unknownDevice() {
         if (!_options.device) {
@@ -130,13 +173,12 @@ private:
             std::find(devices.begin(), devices.end(), *_options.device) != devices.end();
         return isKnown ? std::nullopt
                        : std::optional(
-                             formatText("The store has no device \"%@\"%@.",
-                                        {*_options.device, suggestion(*_options.device, devices)}));
+                             unknown("The store has no device \"%@\"", *_options.device, devices));
     }
 
     /// Of the technologies that the store has.
-    void addLabels() {
-        if (_options.question != Question::Sql) {
+    void addTechnologies() {
+        if (_options.question != Question::Sql && _options.question != Question::Section) {
             return;
         }
         std::vector<const FieldTable*> tables;
@@ -144,6 +186,7 @@ private:
              textsOf(_database, "SELECT DISTINCT technology FROM recordings ORDER BY 1")) {
             if (const RecordedTechnology* technology = technologyOfCommandName(name)) {
                 tables.push_back(&_fields.emplace_back(*technology, _resources));
+                addStoredSections(_database, _file, *tables.back());
             }
         }
         if (!tables.empty()) {
@@ -187,11 +230,13 @@ private:
     }
 
     const StoreAskOptions& _options;
+    std::string _file;
     RequiredTemplates _resources{DirectoryResources::programFolder()};
     std::deque<FieldTable> _fields; // outlive the database
     Database _database;
     const QualityProfile& _profile;
     std::vector<JudgedLevel> _levels;
+    AskedSection _section;
 };
 
 } // namespace

@@ -311,6 +311,22 @@ std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<d
     return levels;
 }
 
+std::string sectionQuery(const StoreAskOptions& options, const AskedSection& section,
+                         const AskedTime& time) {
+    std::string query = "SELECT time_text(time) AS time, device, recording, system, cell, ";
+    query += section.isList ? "entry, " : "";
+    query += "round(hold / 1e6, 3) AS seconds";
+    for (const std::string& field : section.fields) {
+        query += ", \"" + field + "\"";
+    }
+    query += " FROM " + section.table + " WHERE true";
+    constexpr std::int64_t kMicroseconds = 1000;
+    query += time.from ? " AND time >= " + std::to_string(*time.from * kMicroseconds) : "";
+    query += time.to ? " AND time <= " + std::to_string(*time.to * kMicroseconds) : "";
+    query += options.device ? " AND device = " + quotedText(*options.device) : "";
+    return query + (options.entry ? " AND entry = " + quotedText(*options.entry) : "");
+}
+
 std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
                     const AskedTime& time) {
     switch (options.question) {
@@ -332,6 +348,7 @@ std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLeve
         return compareQuery(options, levels, time);
     case StoreAskOptions::Question::Coverage:
         return coverageQuery(options, levels, time);
+    case StoreAskOptions::Question::Section:
     case StoreAskOptions::Question::Sql:
         break;
     }

@@ -35,7 +35,18 @@ struct AskedTime {
     bool isAll() const { return !from && !to; }
 };
 
-/// The query that answers a question, on the tables and views of a store.
+/// A section's table, with its columns.
+struct AskedSection {
+    std::string table; ///< as SQL has it: lte."serving_cell_measurements"
+    std::vector<std::string> fields;
+    bool isList = false;
+};
+
+/// The query for what a section showed.
+std::string sectionQuery(const StoreAskOptions& options, const AskedSection& section,
+                         const AskedTime& time);
+
+/// The query that answers a question about other things, on the tables and views of a store.
 std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
                     const AskedTime& time);
 

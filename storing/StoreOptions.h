@@ -36,11 +36,11 @@ struct StoreWatchOptions {
 
 /// `pallax store query`.
 struct StoreAskOptions {
-    enum class Question { Devices, Recordings, Cells, Series, Compare, Coverage, Sql };
+    enum class Question { Devices, Recordings, Cells, Series, Section, Compare, Coverage, Sql };
 
     std::string store; ///< as for loading
     Question question = Question::Sql;
-    /// The field of a series, the two that are compared, or the query.
+    /// The field of a series, the name of a section, the two that are compared, or the query.
     std::vector<std::string> words = {};
     std::optional<std::string> device = {};
     std::string levels = {};          ///< a field or a measure; empty: of the serving cells

@@ -194,6 +194,42 @@ TEST_F(EndToEndStore, TimesLimitQuestions) {
     EXPECT_EQ(outside.out, "");
 }
 
+TEST_F(EndToEndStore, ASectionHasARowForEachInstant) {
+    const std::string file = world.path("s.db");
+    ASSERT_EQ(run({"store", "load", "--into", file, "--device", "car1", drive}).status, 0);
+    const auto section = [&](std::vector<std::string> words) {
+        std::vector<std::string> arguments{"store", "query", "section",  "--store", file,
+                                           "--to",  "+20s",  "--format", "csv"};
+        arguments.insert(arguments.end(), words.begin(), words.end());
+        return run(arguments);
+    };
+    EXPECT_EQ(section({"lte.reselection_candidates"}).out,
+              "time,device,recording,system,cell,seconds,version,serving_earfcn,serving_cell_id\n"
+              "2023-11-14T22:13:22.036Z,car1,lte-drive.pcap,lte,\"PCI 182, EARFCN 1850\",14,1,1850,"
+              "182\n"
+              "2023-11-14T22:13:36.036Z,car1,lte-drive.pcap,lte,\"PCI 183, EARFCN 1850\",18,1,1850,"
+              "182\n");
+    EXPECT_EQ(
+        section({"serving_cell_info"}).out,
+        "time,device,recording,system,cell,seconds,physical_cell_id,download_frequency,"
+        "upload_frequency,download_bandwidth,upload_bandwidth,cell_identity,"
+        "tracking_area_code,freq_band_indicator,num_tx_antennas,uarfcn\n"
+        "2023-11-14T22:13:22.036Z,car1,lte-drive.pcap,lte,\"PCI 182, EARFCN 1850\",2,182,1850,"
+        "19850,20 MHz,20 MHz,26743041,6701,3,2,\n"
+        "2023-11-14T22:13:24.036Z,car1,lte-drive.pcap,lte,\"PCI 182, EARFCN 1850\",12,182,1850,"
+        "19850,20 MHz,20 MHz,26743041,6701,3,2,1850\n"
+        "2023-11-14T22:13:36.036Z,car1,lte-drive.pcap,lte,\"PCI 183, EARFCN 1850\",8,183,1850,"
+        "19850,20 MHz,20 MHz,26744321,6699,3,2,\n");
+    EXPECT_EQ(section({"serving_cel_info"}).err,
+              "pallax: No section of the store is named \"serving_cel_info\". Did you mean "
+              "\"serving_cell_info\"?\n");
+    EXPECT_EQ(run({"store", "query", "--store", file, "--format", "csv", "--sql",
+                   "select count(*) as n from lte.serving_cell_info where device = 'car1'"})
+                  .out,
+              "n\n11\n");
+    EXPECT_FALSE(std::filesystem::exists(file + "-wal")) << "nothing is left beside it";
+}
+
 TEST_F(EndToEndStore, LabelsOfAllTechnologiesAreThere) {
     const std::string file = world.path("s.db");
     ASSERT_EQ(run({"store", "load", "--into", file, drive, sample("umts-drive.pcap")}).status, 0);

@@ -48,6 +48,10 @@ TEST(StoreOptions, QueryTakesAQuestion) {
     EXPECT_EQ(cells.profile, "field");
     EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "compare", "a", "b"}).words,
               (std::vector<std::string>{"a", "b"}));
+    const auto section = parsed<StoreAskOptions>(
+        {"store", "query", "section", "lte.x", "--entry", "PCI 1", "--from", "start"});
+    EXPECT_EQ(section.question, Question::Section);
+    EXPECT_EQ(section.words, std::vector<std::string>{"lte.x"});
     EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "devices"}).question, Question::Devices);
     EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "recordings"}).question,
               Question::Recordings);
@@ -107,15 +111,19 @@ TEST(StoreOptions, WrongOnesAreToldInASentence) {
               "pallax: load takes recordings (see pallax store --help)\n");
     EXPECT_EQ(refusal({"store", "load", "--device", "", "a"}),
               "pallax: a device has a name (see pallax store --help)\n");
-    EXPECT_EQ(refusal({"store", "query"}),
-              "pallax: query takes a question (devices|recordings|cells|series|compare|coverage) "
-              "or --sql (see pallax store --help)\n");
-    EXPECT_EQ(refusal({"store", "query", "cell"}),
-              "pallax: query: \"cell\" is not one of "
-              "devices|recordings|cells|series|compare|coverage. Did you mean \"cells\"? (see "
-              "pallax store --help)\n");
+    EXPECT_EQ(
+        refusal({"store", "query"}),
+        "pallax: query takes a question (devices|recordings|cells|series|section|compare|coverage) "
+        "or --sql (see pallax store --help)\n");
+    EXPECT_EQ(
+        refusal({"store", "query", "cell"}),
+        "pallax: query: \"cell\" is not one of "
+        "devices|recordings|cells|series|section|compare|coverage. Did you mean \"cells\"? (see "
+        "pallax store --help)\n");
     EXPECT_EQ(refusal({"store", "query", "series"}),
               "pallax: series takes a field (see pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "query", "section"}),
+              "pallax: section takes the name of a section (see pallax store --help)\n");
     EXPECT_EQ(refusal({"store", "query", "compare", "a"}),
               "pallax: compare takes two words (see pallax store --help)\n");
     EXPECT_EQ(refusal({"store", "query", "devices", "a"}),

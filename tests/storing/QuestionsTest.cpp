@@ -80,6 +80,25 @@ TEST(QuotedText, IsTheTextForSql) {
     EXPECT_EQ(quotedText(""), "''");
 }
 
+TEST(SectionQuery, HasTheFieldsBetweenTimeAndOrigin) {
+    StoreAskOptions options;
+    AskedSection section;
+    section.table = "lte.cells";
+    section.fields = {"pci", "rsrp"};
+    EXPECT_EQ(sectionQuery(options, section, {}),
+              "SELECT time_text(time) AS time, device, recording, system, cell, round(hold / 1e6, "
+              "3) AS seconds, \"pci\", \"rsrp\" FROM lte.cells WHERE true");
+    options.device = "it's";
+    options.entry = "PCI 1";
+    section.isList = true;
+    section.fields = {"pci"};
+    EXPECT_EQ(
+        sectionQuery(options, section, {5, 7}),
+        "SELECT time_text(time) AS time, device, recording, system, cell, entry, round(hold / "
+        "1e6, 3) AS seconds, \"pci\" FROM lte.cells WHERE true AND time >= 5000 AND time <= "
+        "7000 AND device = 'it''s' AND entry = 'PCI 1'");
+}
+
 TEST_F(QuestionsTest, TotalsAnswerAsTheIntervalsDo) {
     drive(1, std::chrono::seconds(400));
     (void)load(write("one.pcap"));
