@@ -4,6 +4,8 @@
 #include "text/Format.h"
 
 #include <map>
+#include <set>
+#include <string_view>
 #include <utility>
 
 namespace pallax {
@@ -16,6 +18,7 @@ constexpr const char* kStoreFooter = R"(Examples:
   pallax store watch --into fleet.db arriving
   pallax store query cells --below -110
   pallax store query series measured_rsrp --device car1 --every 1h
+  pallax store query cells --from 2026-11-20T14:00 --to 2026-11-20T15:30
   pallax store query compare 2026-11-20 2026-11-21
   pallax store query --sql "select * from event where kind = 'service-lost'"
   pallax store setup --into clickhouse://db1/fleet
@@ -65,10 +68,18 @@ which share of that time it was below a border, since when, and the values that
 were not exceeded for 5, 50 and 95 % of the time. The levels are those that the
 status shows; --level takes a field, the end of its name, or a measure (rsrp).
 The border is --below or, by default, where the profile's grade "fair" ends.
+--from and --to limit what cells, series, section, compare and coverage look at,
+with times as pallax decode takes them: "start" and "end" are those of what the
+store has, of one device with --device. A value counts for the part of its time
+that lies between them; a section has the rows that begin there.
 
 series FIELD: the course of a field of numbers in steps (--every 1m), for each
 device and list entry: least, mean and greatest value, and for which share of
 the step it was known.
+
+section NAME: what a section of the display showed (serving_cell_measurements),
+or a list in it (neighbor_cells_list): a row for each time in which nothing of
+it changed, with a column for each field.
 
 compare A B: the levels of two devices, recordings or days (2026-11-20, in UTC),
 and the events of each kind per hour.
@@ -77,10 +88,10 @@ coverage: for each device and level, for which share of the time it had each
 grade of the profile.
 
 --sql: a query on the views span, event, cell and field, which are those of
-pallax-sql(7) with the columns device and recording; on measurement, which
-also tells the serving cell; or on the tables of the file, which sqlite3 opens,
-too. Times of values are in whole milliseconds. A server has the dialect of
-ClickHouse.
+pallax-sql(7) with the columns device and recording, as are, in a file, the
+tables of the sections; on measurement, which also tells the serving cell; or on
+the tables of the file, which sqlite3 opens, too. Times of values are in whole
+milliseconds. A server has the dialect of ClickHouse, and no sections.
 
 Exit status:
   0   success, or the reader of the output has gone
@@ -128,9 +139,10 @@ void addEvery(CLI::App& app, StoreRequest& request) {
     const auto take = [&request](const std::string& text) {
         if (text == "tick" || text == "packet") {
             request.loading.resolution = text == "tick" ? Resolution::Tick : Resolution::Packet;
-            return;
+        } else {
+            request.asking.every = stepOf(text);
+            request.isStep = true;
         }
-        request.asking.every = stepOf(text);
     };
     app.add_option_function<std::string>(
            "--every", take,
@@ -144,7 +156,10 @@ void addAsking(CLI::App& app, StoreAskOptions& asking) {
         ->type_name("FIELD");
     app.add_option("--below", asking.below, "The border of a bad level (default: of the profile)")
         ->type_name("NUMBER");
-    app.add_option("--entry", asking.entry, "Only this list entry of a series")->type_name("WORDS");
+    addTime(app, "--from", asking.from, "Only values from this time on");
+    addTime(app, "--to", asking.to, "Only values up to this time");
+    app.add_option("--entry", asking.entry, "Only this list entry of a series or section")
+        ->type_name("WORDS");
     app.add_option("--profile", asking.profile, "The profile that judges levels (default: android)")
         ->type_name("android|field|operator|NAME");
     addChoice<RowFormat>(
@@ -167,10 +182,56 @@ void addAsking(CLI::App& app, StoreAskOptions& asking) {
 /// The question of the first word, and how many words follow it.
 const std::vector<std::pair<std::string, std::pair<Question, std::size_t>>>& questions() {
     static const std::vector<std::pair<std::string, std::pair<Question, std::size_t>>> all{
-        {"devices", {Question::Devices, 0}}, {"recordings", {Question::Recordings, 0}},
-        {"cells", {Question::Cells, 0}},     {"series", {Question::Series, 1}},
-        {"compare", {Question::Compare, 2}}, {"coverage", {Question::Coverage, 0}}};
+        {"devices", {Question::Devices, 0}},  {"recordings", {Question::Recordings, 0}},
+        {"cells", {Question::Cells, 0}},      {"series", {Question::Series, 1}},
+        {"section", {Question::Section, 1}},  {"compare", {Question::Compare, 2}},
+        {"coverage", {Question::Coverage, 0}}};
     return all;
+}
+
+/// Which actions and questions take an option that not all take.
+struct OptionUse {
+    const char* option;
+    std::set<std::string_view> takers;
+};
+const std::vector<OptionUse>& optionUses() {
+    static const std::set<std::string_view> loading{"load", "watch"};
+    static const std::set<std::string_view> asking{"devices", "recordings", "cells",    "series",
+                                                   "section", "compare",    "coverage", "--sql"};
+    static const std::set<std::string_view> measuring{"cells", "series", "section", "compare",
+                                                      "coverage"};
+    static const std::set<std::string_view> judging{"cells", "compare", "coverage"};
+    static const std::vector<OptionUse> all{{"--jobs", {"load"}},
+                                            {"--pseudonyms", loading},
+                                            {"--device",
+                                             {"load", "watch", "devices", "recordings", "cells",
+                                              "series", "section", "compare", "coverage"}},
+                                            {"--every", {"load", "watch", "series"}},
+                                            {"--from", measuring},
+                                            {"--to", measuring},
+                                            {"--level", judging},
+                                            {"--profile", judging},
+                                            {"--below", {"cells", "compare"}},
+                                            {"--entry", {"series", "section"}},
+                                            {"--format", asking},
+                                            {"--timeout", asking},
+                                            {"--sql", asking}};
+    return all;
+}
+
+/// Why the options do not fit to an action or question; empty if they do.
+std::string refusalOf(const StoreRequest& request, const std::string& taker) {
+    for (const OptionUse& use : optionUses()) {
+        if (request.app->count(use.option) > 0 && !use.takers.contains(taker)) {
+            return formatText("%@ takes no %@", {taker, use.option});
+        }
+    }
+    if (request.app->count("--every") > 0 && request.isStep != (taker == "series")) {
+        return formatText(
+            "%@: --every takes %@",
+            {taker, taker == "series" ? "a time (30s, 1m, 6h, 1d)" : "tick or packet"});
+    }
+    return "";
 }
 
 ParsedOptions askOptions(const StoreRequest& request) {
@@ -179,6 +240,9 @@ ParsedOptions askOptions(const StoreRequest& request) {
     asking.store = request.loading.store;
     std::vector<std::string> words = request.words;
     if (request.sql) {
+        if (const std::string refusal = refusalOf(request, "--sql"); !refusal.empty()) {
+            return wrongUsage(refusal, "store");
+        }
         if (words.size() != 1) {
             return wrongUsage("--sql takes one query", "store");
         }
@@ -195,9 +259,13 @@ ParsedOptions askOptions(const StoreRequest& request) {
         if (words.size() != question.second) {
             return wrongUsage(
                 formatText("%@ takes %@", {name, question.second == 0   ? "no words"
-                                                 : question.second == 1 ? "a field"
-                                                                        : "two words"}),
+                                                 : question.second == 2 ? "two words"
+                                                 : name == "series"     ? "a field"
+                                                                        : "the name of a section"}),
                 "store");
+        }
+        if (const std::string refusal = refusalOf(request, name); !refusal.empty()) {
+            return wrongUsage(refusal, "store");
         }
         asking.question = question.first;
         asking.words = words;
@@ -221,6 +289,7 @@ ParsedOptions setupOptions(const StoreRequest& request) {
 } // namespace
 
 void addStore(CLI::App& app, StoreRequest& request) {
+    request.app = &app;
     addChoice<StoreRequest::Action>(app, "ACTION", request.action,
                                     {{"load", StoreRequest::Action::Load},
                                      {"query", StoreRequest::Action::Query},
@@ -231,8 +300,8 @@ void addStore(CLI::App& app, StoreRequest& request) {
     app.add_option(
            "WORDS", request.words,
            "The recordings to load (pcap or pcapng), or a question: devices, recordings, "
-           "cells, series FIELD, compare A B, coverage or, with --sql, a query; or the folder to "
-           "watch; or clusters to set up")
+           "cells, series FIELD, section NAME, compare A B, coverage or, with --sql, a query; or "
+           "the folder to watch; or clusters to set up")
         ->type_name("");
     app.add_option("--into,--store", request.loading.store,
                    "The file or the address of the store (default: measurements.db in the folder "
@@ -252,13 +321,18 @@ ParsedOptions storeOptions(const StoreRequest& request) {
     if (request.action == StoreRequest::Action::Query) {
         return askOptions(request);
     }
-    if (request.action == StoreRequest::Action::Load && request.words.empty()) {
+    const bool isWatch = request.action == StoreRequest::Action::Watch;
+    if (const std::string refusal = refusalOf(request, isWatch ? "watch" : "load");
+        !refusal.empty()) {
+        return wrongUsage(refusal, "store");
+    }
+    if (!isWatch && request.words.empty()) {
         return wrongUsage("load takes recordings", "store");
     }
     if (request.loading.device && request.loading.device->empty()) {
         return wrongUsage("a device has a name", "store");
     }
-    if (request.action == StoreRequest::Action::Watch) {
+    if (isWatch) {
         return request.words.size() == 1
                    ? ParsedOptions(StoreWatchOptions{request.loading, request.words.front()})
                    : wrongUsage("watch takes one folder", "store");

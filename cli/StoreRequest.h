@@ -2,6 +2,8 @@
 
 #include "cli/Options.h"
 
+#include <CLI/CLI.hpp>
+
 #include <string>
 #include <vector>
 
@@ -9,6 +11,7 @@ namespace pallax {
 
 /// What the user wants of a store.
 struct StoreRequest {
+    const CLI::App* app = nullptr; ///< which knows the options that were given
     enum class Action { Load, Query, Watch, Setup };
 
     Action action = Action::Load;
@@ -16,6 +19,7 @@ struct StoreRequest {
     std::optional<unsigned> jobs = {};
     StoreAskOptions asking = {};
     std::vector<std::string> words = {}; ///< recordings, a question, a folder or clusters
+    bool isStep = false;                 ///< --every gave the step of a series
     bool sql = false;                    ///< the question is a query
 };
 

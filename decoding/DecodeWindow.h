@@ -34,6 +34,9 @@ public:
     std::optional<std::string> open(const TimeSpan& span, const ZoneRule& zone);
 
     bool isOpen() const { return _isOpen; }
+    // What `open` has found; the earliest or latest time where a text is missing.
+    Time from() const { return _from; }
+    Time to() const { return _to; }
 
     /// Whether the recording is over before a packet of this time.
     bool isOverBefore(Time packet);

@@ -137,6 +137,10 @@ void run(sqlite3& connection, const std::string& text) {
 
 } // namespace
 
+std::string sqliteFileName(const std::string& file) {
+    return file.starts_with('/') ? file : "./" + file;
+}
+
 void Query::Finalize::operator()(sqlite3_stmt* statement) const {
     sqlite3_finalize(statement);
 }
@@ -191,9 +195,9 @@ Database::Database() : _authority(std::make_unique<Authority>()), _schemas{"main
 
 Database::Database(const std::string& file)
     : _authority(std::make_unique<Authority>()), _schemas{"main"} {
-    // SQLite might take any other name for a URI or a temporary database. It is opened for writing,
-    // because only then can SQLite clean up after a writer that was killed; queries do not write.
-    open(file.starts_with('/') ? file : "./" + file, SQLITE_OPEN_READWRITE);
+    // For writing, because only then can SQLite clean up after a writer that was killed; queries do
+    // not write.
+    open(sqliteFileName(file), SQLITE_OPEN_READWRITE);
     run(*_connection, "PRAGMA query_only = true");
     // Anybody may have made it.
     sqlite3_db_config(_connection.get(), SQLITE_DBCONFIG_DEFENSIVE, 1, nullptr);
@@ -227,6 +231,7 @@ Database::~Database() = default;
 void Database::add(const std::string& schema, const std::string& name,
                    std::unique_ptr<QueryTable> table) {
     sqlite3_set_authorizer(_connection.get(), nullptr, nullptr);
+    run(*_connection, "PRAGMA query_only = false");
     if (std::find(_schemas.begin(), _schemas.end(), schema) == _schemas.end()) {
         run(*_connection, "ATTACH ':memory:' AS \"" + schema + "\"");
         _schemas.push_back(schema);
@@ -241,6 +246,7 @@ void Database::add(const std::string& schema, const std::string& name,
     if (!addVirtualTable(*_connection, qualified.c_str(), *_added.back())) {
         throw std::runtime_error(sqlite3_errmsg(_connection.get()));
     }
+    run(*_connection, "PRAGMA query_only = true");
 }
 
 std::vector<Database::Table> Database::tables() const {

@@ -23,6 +23,10 @@ struct Authority;
 struct Column;
 class QueryTable;
 
+/// The name of a file as SQLite needs it, so that it is not taken for a URI, an option or a
+/// temporary database.
+std::string sqliteFileName(const std::string& file);
+
 /// Why a query cannot be run or has been stopped.
 struct QueryError {
     std::string sentence;

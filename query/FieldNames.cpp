@@ -18,9 +18,7 @@ FieldIndex FieldNames::find(const std::string& name) {
         throw std::invalid_argument(unknownField(_fields, name));
     }
     if (fields.size() > 1) {
-        throw std::invalid_argument(
-            formatText("\"%@\" can be \"%@\" or \"%@\"",
-                       {name, _fields[fields[0]].name, _fields[fields[1]].name}));
+        throw std::invalid_argument(ambiguousField(name, _fields[fields[0]], _fields[fields[1]]));
     }
     return _found.emplace(name, fields[0]).first->second;
 }
@@ -45,6 +43,10 @@ std::string unknownField(const FieldTable& fields, std::string_view name,
         others.push_back(isFull ? fields[index].name : lastWordOf(fields[index].name));
     }
     return formatText("\"%@\" is not a field", {name}) + suggestion(name, others);
+}
+
+std::string ambiguousField(std::string_view name, const FieldInfo& one, const FieldInfo& other) {
+    return formatText("\"%@\" can be \"%@\" or \"%@\"", {name, one.name, other.name});
 }
 
 } // namespace pallax

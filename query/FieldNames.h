@@ -30,5 +30,7 @@ private:
 /// "\"rspr\" is not a field. Did you mean \"rsrp\"?" `others` are further names that are possible.
 std::string unknownField(const FieldTable& fields, std::string_view name,
                          std::vector<std::string> others = {});
+/// "\"rsrp\" can be \"lte.a.rsrp\" or \"lte.b.rsrp\"".
+std::string ambiguousField(std::string_view name, const FieldInfo& one, const FieldInfo& other);
 
 } // namespace pallax

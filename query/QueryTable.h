@@ -18,9 +18,11 @@ namespace pallax {
 struct Column {
     enum class Role {
         Plain,        ///< nothing
+        Value,        ///< nothing; it has the values of a field
         TimeStamp,    ///< UTC in microseconds: where in the recording they are
         PacketNumber, ///< likewise, by the packet's number
         FieldName,    ///< of which field they tell, by its name
+        DeviceName,   ///< of which device, in a store
         // Of a table that is called like a function, series('field', 100); hidden, in their order:
         FieldArgument, ///< the name of a field, without which there are no rows
         CountArgument, ///< a whole number, which can be left out
@@ -39,6 +41,7 @@ struct RowBounds {
     std::int64_t leastTime = std::numeric_limits<std::int64_t>::min(); ///< as in the column
     std::int64_t mostTime = std::numeric_limits<std::int64_t>::max();
     std::optional<std::string> field = std::nullopt;
+    std::optional<std::string> device = std::nullopt;
     std::optional<std::int64_t> count = std::nullopt;
     /// Asked during long work, if there is one; false stops the query.
     const std::function<bool()>* mayContinue = nullptr;

@@ -5,7 +5,7 @@
 #include "query/Database.h"
 #include "query/EventTable.h"
 #include "query/FieldListTable.h"
-#include "query/FieldNames.h"
+#include "query/LabelFunction.h"
 #include "query/PacketTable.h"
 #include "query/SampleTable.h"
 #include "query/SectionTable.h"
@@ -30,21 +30,6 @@ Time timeOf(std::int64_t microseconds) {
     return Time(std::chrono::microseconds(std::clamp(microseconds, earliest, latest)));
 }
 
-/// label(field, raw): the label of a raw number; NULL for a number that is shown itself.
-Database::Function labelFunction(const FieldTable& fields) {
-    return [&fields, names = std::make_shared<FieldNames>(fields)](
-               std::span<const QueryValue> arguments) -> QueryValue {
-        const auto* name = std::get_if<std::string>(&arguments[0]);
-        const auto* raw = std::get_if<std::int64_t>(&arguments[1]);
-        if (name == nullptr) {
-            return {};
-        }
-        const FieldInfo& field = fields[names->find(*name)];
-        std::string label(raw != nullptr ? field.labelOf(*raw) : std::string_view());
-        return label.empty() ? QueryValue() : QueryValue(std::move(label));
-    };
-}
-
 } // namespace
 
 void addTimelineTables(Database& database, Timeline& timeline) {
@@ -58,7 +43,7 @@ void addTimelineTables(Database& database, Timeline& timeline) {
     database.add("main", "field", fieldListTable(timeline.fields()));
     database.add("main", "tables", tablesTable(database));
     database.add("main", "columns", columnsTable(database));
-    database.addFunction("label", 2, labelFunction(timeline.fields()));
+    addLabelFunction(database, {&timeline.fields()});
     if (timeline.fields().size() == 0) {
         return;
     }

@@ -89,7 +89,10 @@ char letterOf(Column::Role role) {
         return 'f';
     case Column::Role::CountArgument:
         return 'c';
+    case Column::Role::DeviceName:
+        return 'd';
     case Column::Role::Plain:
+    case Column::Role::Value:
         break;
     }
     return '\0';
@@ -116,7 +119,10 @@ double shareOf(char letter, char bound) {
     constexpr double kRange = 0.25;
     constexpr double kOneField = 0.02;
     constexpr double kOnePlace = 0.0001;
-    return bound != '=' ? kRange : letter == 'f' ? kOneField : letter == 'c' ? 1.0 : kOnePlace;
+    return bound != '='                     ? kRange
+           : letter == 'f' || letter == 'd' ? kOneField
+           : letter == 'c'                  ? 1.0
+                                            : kOnePlace;
 }
 
 /// Whether texts are compared byte by byte, not with COLLATE NOCASE.
@@ -140,7 +146,7 @@ int chooseBounds(sqlite3_vtab* table, sqlite3_index_info* info) {
         const char bound = boundOf(constraint.op);
         const bool isRange = letter == 't' || letter == 'p';
         if (letter == '\0' || bound == '\0' || (!isRange && bound != '=') ||
-            (letter == 'f' && !isExact(*info, index))) {
+            ((letter == 'f' || letter == 'd') && !isExact(*info, index))) {
             continue;
         }
         plan += {letter, bound};
@@ -192,8 +198,8 @@ struct Around {
 
 void bound(RowBounds& bounds, char letter, char how, sqlite3_value* value) {
     const int type = sqlite3_value_numeric_type(value);
-    if (letter == 'f') {
-        bounds.field = std::string(textOf(value));
+    if (letter == 'f' || letter == 'd') {
+        (letter == 'f' ? bounds.field : bounds.device) = std::string(textOf(value));
         return;
     }
     if (type != SQLITE_INTEGER && type != SQLITE_FLOAT) {

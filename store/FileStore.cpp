@@ -1,5 +1,6 @@
 #include "store/FileStore.h"
 
+#include "fields/Measures.h"
 #include "query/CellFinder.h"
 #include "query/TimelineTables.h"
 #include "store/IntervalBatch.h"
@@ -127,12 +128,29 @@ void FileStore::addFound(const RecordingMeasurements& measurements) {
     }
 }
 
+/// Sums up the intervals of levels.
+void FileStore::addTotals() {
+    Statement add = _connection->prepare(
+        "INSERT INTO totals (field, site, recording, number, hold, first) "
+        "SELECT f.id, coalesce(s.site, 0), ?1, CASE typeof(i.number) WHEN 'integer' THEN "
+        "i.number * s.step ELSE i.number END AS held, sum(i.hold), min(i.time) "
+        "FROM fields f CROSS JOIN series s ON s.field = f.id AND s.recording = ?1 "
+        "CROSS JOIN intervals i ON i.id BETWEEN s.first_row AND s.last_row "
+        "WHERE f.name = ?2 AND i.number IS NOT NULL AND i.hold > 0 GROUP BY f.id, 2, held");
+    for (const MeasuredField& field : measuredFields()) {
+        add.bind(1, _recording).bind(2, field.name).run();
+    }
+}
+
 void FileStore::remove(const LoadedRecording& recording) {
     constexpr const char* kIntervals =
         "DELETE FROM intervals WHERE id BETWEEN (SELECT min(first_row) FROM series WHERE recording "
         "= ?1) AND (SELECT max(last_row) FROM series WHERE recording = ?1)";
+    constexpr const char* kTotals = "DELETE FROM totals WHERE recording = ?1 AND (field, site) IN "
+                                    "(SELECT field, coalesce(site, 0) FROM series WHERE recording "
+                                    "= ?1)";
     for (const char* sql :
-         {kIntervals, "DELETE FROM series WHERE recording = ?1",
+         {kIntervals, kTotals, "DELETE FROM series WHERE recording = ?1",
           "DELETE FROM events WHERE recording = ?1", "DELETE FROM cells WHERE recording = ?1",
           "DELETE FROM recordings WHERE id = ?1"}) {
         _connection->prepare(sql).bind(1, static_cast<std::int64_t>(recording.id)).run();
@@ -146,6 +164,7 @@ void FileStore::finish(const std::optional<std::string>& trouble) {
             .bind(2, _recording)
             .run();
     }
+    addTotals();
     _transaction->commit();
     abandon();
 }

@@ -32,6 +32,8 @@ public:
     void abandon() override;
 
 private:
+    void addTotals();
+
     std::unique_ptr<StoreConnection> _connection;
     std::optional<StoreConnection::Transaction> _transaction;
     std::optional<NamedRows> _names;

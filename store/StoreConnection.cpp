@@ -1,6 +1,7 @@
 #include "store/StoreConnection.h"
 
 #include "host/Descriptor.h"
+#include "query/Database.h"
 #include "store/StoreSchema.h"
 #include "text/Format.h"
 
@@ -35,11 +36,6 @@ std::string sentenceOf(const std::string& file, sqlite3* connection, int code) {
         return formatText("%@: %@.",
                           {file, connection != nullptr ? sqlite3_errmsg(connection) : "no memory"});
     }
-}
-
-/// The name of a file as SQLite needs it, so that it is not taken for a URI or an option.
-std::string fileName(const std::string& file) {
-    return file.starts_with('/') ? file : "./" + file;
 }
 
 /// Another program makes or tidies up the file, for which SQLite does not wait.
@@ -159,6 +155,14 @@ std::string Statement::text(int column) const {
                : std::string();
 }
 
+double Statement::real(int column) const {
+    return sqlite3_column_double(_statement.get(), column);
+}
+
+bool Statement::isInteger(int column) const {
+    return sqlite3_column_type(_statement.get(), column) == SQLITE_INTEGER;
+}
+
 bool Statement::isNull(int column) const {
     return sqlite3_column_type(_statement.get(), column) == SQLITE_NULL;
 }
@@ -170,8 +174,8 @@ void StoreConnection::Close::operator()(sqlite3* connection) const {
 StoreConnection::StoreConnection(std::string file, Mode mode) : _file(std::move(file)) {
     sqlite3* connection = nullptr;
     const int flags = mode == Mode::Read ? SQLITE_OPEN_READONLY : SQLITE_OPEN_READWRITE;
-    const int code =
-        sqlite3_open_v2(fileName(_file).c_str(), &connection, flags | SQLITE_OPEN_NOMUTEX, nullptr);
+    const int code = sqlite3_open_v2(sqliteFileName(_file).c_str(), &connection,
+                                     flags | SQLITE_OPEN_NOMUTEX, nullptr);
     _connection.reset(connection);
     if (code != SQLITE_OK) {
         fail(_file, connection, code);
@@ -210,20 +214,29 @@ std::unique_ptr<StoreConnection> StoreConnection::open(const std::string& file) 
     // As SQLite would create it, but for its user alone.
     constexpr mode_t kPrivate = 0600;
     constexpr int kFlags = O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC;
-    const Descriptor created(::open(fileName(file).c_str(), kFlags, kPrivate)); // NOLINT(*-vararg)
+    const Descriptor created(
+        ::open(sqliteFileName(file).c_str(), kFlags, kPrivate)); // NOLINT(*-vararg)
     if (!created && errno != EEXIST) {
         throw StoreFailure(formatText("%@ cannot be created: %@.", {file, std::strerror(errno)}));
     }
     return whenFree([&] { return std::unique_ptr<StoreConnection>(new StoreConnection(file)); });
 }
 
-std::optional<std::string> StoreConnection::refusal(const std::string& file) {
+std::unique_ptr<StoreConnection> StoreConnection::openToRead(const std::string& file) {
     std::error_code ignored;
     if (!std::filesystem::exists(file, ignored)) {
-        return formatText("There is no store %@ (see pallax store load).", {file});
+        throw StoreFailure(formatText("There is no store %@ (see pallax store load).", {file}));
     }
+    return whenFree([&] {
+        std::unique_ptr<StoreConnection> store(new StoreConnection(file, Mode::Read));
+        store->check(Empty::Refused);
+        return store;
+    });
+}
+
+std::optional<std::string> StoreConnection::refusal(const std::string& file) {
     try {
-        whenFree([&] { StoreConnection(file, Mode::Read).check(Empty::Refused); });
+        (void)openToRead(file);
     } catch (const StoreFailure& failure) {
         return failure.what();
     }

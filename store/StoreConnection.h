@@ -41,7 +41,9 @@ public:
     void reset();
 
     std::int64_t integer(int column) const;
+    double real(int column) const;
     std::string text(int column) const;
+    bool isInteger(int column) const;
     bool isNull(int column) const;
 
 private:
@@ -61,6 +63,8 @@ public:
     /// Creates the file, which only its user may read, if it is missing. Refuses, before anything
     /// is written, what is no store or one of a later version.
     static std::unique_ptr<StoreConnection> open(const std::string& file);
+    /// Opens an existing store; what it says must not change it.
+    static std::unique_ptr<StoreConnection> openToRead(const std::string& file);
     /// Why an existing file cannot be asked as a store; nothing if it can.
     static std::optional<std::string> refusal(const std::string& file);
 

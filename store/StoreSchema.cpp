@@ -83,6 +83,18 @@ CREATE TABLE intervals (
                            -- first part, -1 in the others
 );
 
+CREATE TABLE totals (
+    -- Of fields that profiles judge, how long each number held in a serving cell: a cell is judged
+    -- by some hundred rows for each recording instead of thousands of intervals.
+    field INTEGER NOT NULL REFERENCES fields,
+    site INTEGER NOT NULL, -- 0: not known yet
+    recording INTEGER NOT NULL REFERENCES recordings,
+    number NOT NULL,
+    hold INTEGER NOT NULL, -- milliseconds
+    first INTEGER NOT NULL, -- when it held first, since the recording's first packet
+    PRIMARY KEY (field, site, recording, number)
+) WITHOUT ROWID;
+
 CREATE TABLE events (
     recording INTEGER NOT NULL REFERENCES recordings,
     time INTEGER NOT NULL, -- microseconds since 1970, as in pallax sql

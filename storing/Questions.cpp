@@ -63,22 +63,60 @@ std::string levelTables(const std::vector<JudgedLevel>& levels) {
            "),\nmember AS (SELECT n, id AS field FROM named JOIN fields USING (name)),\n";
 }
 
-/// The values of the current level that a condition leaves.
-std::string levelValues(const std::string& condition) {
-    return "FROM (SELECT i.hold, CASE typeof(i.number) WHEN 'integer' THEN i.number * s.step ELSE "
-           "i.number END AS number, (r.first + i.time) * 1000 AS start\n"
-           "FROM member m CROSS JOIN series s ON s.field = m.field "
-           "CROSS JOIN recordings r ON r.id = s.recording "
-           "CROSS JOIN intervals i ON i.id BETWEEN s.first_row AND s.last_row\n"
-           "WHERE m.n = l.n AND i.number IS NOT NULL AND i.hold > 0" +
-           condition + ")";
+/// The part of an interval that is in the asked time.
+struct Clipped {
+    /// `start` and `end` are expressions in units of which a millisecond has `unit`.
+    Clipped(const AskedTime& time, std::string itsStart, std::string itsEnd, std::int64_t unit)
+        : start(std::move(itsStart)), end(std::move(itsEnd)) {
+        if (time.from) {
+            const std::string from = std::to_string(*time.from * unit);
+            condition += formatText(" AND %@ > %@", {end, from});
+            start = formatText("max(%@, %@)", {start, from});
+        }
+        if (time.to) {
+            const std::string to = std::to_string(*time.to * unit);
+            condition += formatText(" AND %@ < %@", {start, to});
+            end = formatText("min(%@, %@)", {end, to});
+        }
+    }
+
+    std::string start;
+    std::string end;
+    std::string condition = {}; ///< " AND …": whether there is a part
+};
+
+/// The values of the current level that a condition on recordings `r` and sites `s.site` leaves.
+std::string levelValues(const std::string& condition, const AskedTime& time) {
+    const Clipped part(time, "(r.first + i.time)", "(r.first + i.time + i.hold)", 1);
+    const Clipped series(time, "(r.first + s.first)", "(r.first + s.last)", 1);
+    return formatText(
+        "FROM (SELECT %@ - %@ AS hold, CASE typeof(i.number) WHEN 'integer' THEN "
+        "i.number * s.step ELSE i.number END AS number, %@ * 1000 AS start, "
+        "r.device\n"
+        "FROM member m CROSS JOIN series s ON s.field = m.field "
+        "CROSS JOIN recordings r ON r.id = s.recording "
+        "CROSS JOIN intervals i ON i.id BETWEEN s.first_row AND s.last_row\n"
+        "WHERE m.n = l.n AND i.number IS NOT NULL AND i.hold > 0%@%@%@)",
+        {part.end, part.start, part.start, series.condition, part.condition, condition});
+}
+
+/// The same for questions that do not look at times within recordings: of all times, each number
+/// is one row.
+std::string levelTotals(const std::string& condition, const AskedTime& time) {
+    return !time.isAll()
+               ? levelValues(condition, time)
+               : "FROM (SELECT s.hold, s.number, (r.first + s.first) * 1000 AS start, r.device\n"
+                 "FROM member m CROSS JOIN totals s ON s.field = m.field "
+                 "CROSS JOIN recordings r ON r.id = s.recording WHERE m.n = l.n" +
+                     condition + ")";
 }
 
 // Several sums of one pass over the values, as elements of a JSON array.
 constexpr const char* kSummary =
     "SELECT json_array(sum(hold), sum(CASE WHEN number * sign < border * sign THEN hold ELSE 0 "
     "END), min(CASE WHEN number * sign < border * sign THEN start END), "
-    "quantile(number, hold, 0.05), quantile(number, hold, 0.5), quantile(number, hold, 0.95))\n";
+    "quantile(number, hold, 0.05), quantile(number, hold, 0.5), quantile(number, hold, 0.95), "
+    "count(DISTINCT device))\n";
 constexpr const char* kHours = "round((summary ->> 0) / 3.6e6, 3) AS hours";
 constexpr const char* kShareBelow =
     "round(100.0 * (summary ->> 1) / (summary ->> 0), 1) AS below_percent";
@@ -87,22 +125,20 @@ constexpr const char* kQuantiles =
 
 /// Of the table `judged`.
 std::string cellsAnswer() {
-    return formatText("SELECT system, cell, level, devices, %@, border, %@, "
+    return formatText("SELECT system, cell, level, summary ->> 6 AS devices, %@, border, %@, "
                       "time_text(summary ->> 2) AS since, %@\n"
                       "FROM judged WHERE summary ->> 0 > 0\n"
                       "ORDER BY below_percent DESC, hours DESC, system, cell, level",
                       {kHours, kShareBelow, kQuantiles});
 }
 
-std::string cellsQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+std::string cellsQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                       const AskedTime& time) {
     return levelTables(levels) +
            formatText("judged AS MATERIALIZED (SELECT p.system, p.identity AS cell, l.level, "
-                      "l.border, (SELECT count(DISTINCT r.device) FROM member m JOIN series s ON "
-                      "s.site = p.id AND s.field = m.field JOIN recordings r ON r.id = s.recording "
-                      "WHERE m.n = l.n%@) AS devices,\n(%@%@) AS summary\n"
+                      "l.border, (%@%@) AS summary\n"
                       "FROM sites p CROSS JOIN level l)\n",
-                      {onlyDevice(options), kSummary,
-                       levelValues(" AND s.site = p.id" + onlyDevice(options))}) +
+                      {kSummary, levelTotals(" AND s.site = p.id" + onlyDevice(options), time)}) +
            cellsAnswer();
 }
 
@@ -134,7 +170,8 @@ std::string compareAnswer(const StoreAskOptions& options) {
 }
 
 /// Levels, and events by the hour of what was recorded.
-std::string compareQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+std::string compareQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                         const AskedTime& time) {
     std::string summaries;
     std::string events;
     for (std::size_t side = 0; side < options.words.size(); ++side) {
@@ -143,10 +180,11 @@ std::string compareQuery(const StoreAskOptions& options, const std::vector<Judge
         summaries += formatText(
             "%@SELECT l.n, %@ AS side, l.level AS what, (%@%@) AS summary FROM level l",
             {side == 0 ? "" : " UNION ALL ", number, kSummary,
-             levelValues(" AND " + isOf(word, "(r.first + i.time)") + onlyDevice(options))});
+             levelValues(" AND " + isOf(word, "(r.first + i.time)") + onlyDevice(options), time)});
         events += formatText("%@SELECT %@ AS side, kind, count(*) AS times FROM recordings r JOIN "
-                             "events e ON e.recording = r.id WHERE %@%@ GROUP BY kind",
+                             "events e ON e.recording = r.id WHERE %@%@%@ GROUP BY kind",
                              {side == 0 ? "" : " UNION ALL ", number, isOf(word, "e.time / 1000"),
+                              Clipped(time, "(e.time / 1000)", "(e.time / 1000 + 1)", 1).condition,
                               onlyDevice(options)});
     }
     return levelTables(levels) +
@@ -192,12 +230,16 @@ std::string withStep(const std::string& text, const StoreAskOptions& options) {
     return replaced(text, "STEP", std::to_string(stepOf(options)));
 }
 
-std::string seriesQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
-    const std::string values =
-        "measurement WHERE field = " + quotedText(levels.front().fields.front()) +
-        " AND number IS NOT NULL AND hold > 0" +
-        (options.device ? " AND device = " + quotedText(*options.device) : "") +
-        (options.entry ? " AND entry = " + quotedText(*options.entry) : "");
+std::string seriesQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                        const AskedTime& time) {
+    constexpr std::int64_t kMicroseconds = 1000;
+    const Clipped part(time, "start", "(start + hold)", kMicroseconds);
+    const std::string values = formatText(
+        "(SELECT device, entry, %@ AS start, %@ - %@ AS hold, number FROM measurement WHERE field "
+        "= %@ AND number IS NOT NULL AND hold > 0%@%@%@) WHERE true",
+        {part.start, part.end, part.start, quotedText(levels.front().fields.front()),
+         part.condition, options.device ? " AND device = " + quotedText(*options.device) : "",
+         options.entry ? " AND entry = " + quotedText(*options.entry) : ""});
     return withStep(replaced(kSeries, "VALUES", values) + kSeriesAnswer, options);
 }
 
@@ -218,7 +260,8 @@ std::string coverageAnswer() {
                       {kHours, shares, std::uint64_t{kGrades.size()}});
 }
 
-std::string coverageQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+std::string coverageQuery(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                          const AskedTime& time) {
     std::string sums = "sum(hold)";
     for (const Grade grade : kGrades) { // those of this grade or a better one
         sums += formatText(", sum(CASE WHEN number * sign >= %@ * sign THEN hold ELSE 0 END)",
@@ -229,7 +272,7 @@ std::string coverageQuery(const StoreAskOptions& options, const std::vector<Judg
                       "(SELECT json_array(%@)\n%@) AS summary\n"
                       "FROM (SELECT DISTINCT device FROM recordings r WHERE true%@) d "
                       "CROSS JOIN level l)\n",
-                      {sums, levelValues(" AND r.device = d.device"), onlyDevice(options)}) +
+                      {sums, levelTotals(" AND r.device = d.device", time), onlyDevice(options)}) +
            coverageAnswer();
 }
 
@@ -308,11 +351,28 @@ std::string answerOf(const StoreAskOptions& options) {
     case StoreAskOptions::Question::Coverage:
         return coverageAnswer();
     default:
-        return queryOf(options, {}); // of the table `recordings`
+        return queryOf(options, {}, {}); // of the table `recordings`
     }
 }
 
-std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels) {
+std::string sectionQuery(const StoreAskOptions& options, const AskedSection& section,
+                         const AskedTime& time) {
+    std::string query = "SELECT time_text(time) AS time, device, recording, system, cell, ";
+    query += section.isList ? "entry, " : "";
+    query += "round(hold / 1e6, 3) AS seconds";
+    for (const std::string& field : section.fields) {
+        query += ", \"" + field + "\"";
+    }
+    query += " FROM " + section.table + " WHERE true";
+    constexpr std::int64_t kMicroseconds = 1000;
+    query += time.from ? " AND time >= " + std::to_string(*time.from * kMicroseconds) : "";
+    query += time.to ? " AND time <= " + std::to_string(*time.to * kMicroseconds) : "";
+    query += options.device ? " AND device = " + quotedText(*options.device) : "";
+    return query + (options.entry ? " AND entry = " + quotedText(*options.entry) : "");
+}
+
+std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                    const AskedTime& time) {
     switch (options.question) {
     case StoreAskOptions::Question::Devices:
         return "SELECT device, count(*) AS recordings, time_text(min(first) * 1000) AS first, "
@@ -325,13 +385,14 @@ std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLeve
                "FROM recordings r WHERE true" +
                onlyDevice(options) + " ORDER BY device, first, name";
     case StoreAskOptions::Question::Cells:
-        return cellsQuery(options, levels);
+        return cellsQuery(options, levels, time);
     case StoreAskOptions::Question::Series:
-        return seriesQuery(options, levels);
+        return seriesQuery(options, levels, time);
     case StoreAskOptions::Question::Compare:
-        return compareQuery(options, levels);
+        return compareQuery(options, levels, time);
     case StoreAskOptions::Question::Coverage:
-        return coverageQuery(options, levels);
+        return coverageQuery(options, levels, time);
+    case StoreAskOptions::Question::Section:
     case StoreAskOptions::Question::Sql:
         break;
     }

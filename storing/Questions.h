@@ -36,8 +36,28 @@ std::string borderOf(const JudgedLevel& level, Grade grade);
 /// The length of a step of a series in microseconds.
 std::int64_t stepOf(const StoreAskOptions& options);
 
-/// The query that answers a question, on the views of a store.
-std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels);
+/// The times that a question is about, in milliseconds since 1970. Nothing: all times.
+struct AskedTime {
+    std::optional<std::int64_t> from = {};
+    std::optional<std::int64_t> to = {};
+
+    bool isAll() const { return !from && !to; }
+};
+
+/// A section's table, with its columns.
+struct AskedSection {
+    std::string table; ///< as SQL has it: lte."serving_cell_measurements"
+    std::vector<std::string> fields;
+    bool isList = false;
+};
+
+/// The query for what a section showed.
+std::string sectionQuery(const StoreAskOptions& options, const AskedSection& section,
+                         const AskedTime& time);
+
+/// The query that answers a question about other things, on the tables and views of a store.
+std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
+                    const AskedTime& time);
 
 /// The last part of that query, which makes the answer of sums that may come from elsewhere: of the
 /// tables `judged` (cells, coverage), `summed` and `happened` (compare), `summed` (series) or

@@ -96,17 +96,22 @@ void addServerTables(Database& database, ServerStore& store, const StoreAskOptio
     } else if (options.device) { // which is first, before those whose names may be suggested
         addTable(database, store,
                  {"recordings",
-                  {"device"},
-                  formatText("SELECT DISTINCT device FROM recordings ORDER BY device = %@ DESC, "
-                             "device LIMIT 100000",
+                  {"device", "first", "last"},
+                  formatText("SELECT device, min(first), max(last) FROM recordings GROUP BY device "
+                             "ORDER BY device = %@ DESC, device LIMIT 100000",
                              {clickHouseText(*options.device)})});
+    } else if (options.from || options.to) {
+        addTable(database, store,
+                 {"recordings",
+                  {"first", "last"},
+                  "SELECT min(first), max(last) FROM recordings HAVING count() > 0"});
     }
 }
 
 std::string addServerQuestion(Database& database, ServerStore& store,
                               const StoreAskOptions& options,
-                              const std::vector<JudgedLevel>& levels) {
-    ServerQuestion question = serverQuestion(options, levels, store);
+                              const std::vector<JudgedLevel>& levels, const AskedTime& time) {
+    ServerQuestion question = serverQuestion(options, levels, time, store);
     for (ServerTable& table : question.tables) {
         addTable(database, store, std::move(table));
     }

@@ -14,7 +14,7 @@ void addServerTables(Database& database, ServerStore& store, const StoreAskOptio
 /// Adds the tables of a question and gives its query.
 std::string addServerQuestion(Database& database, ServerStore& store,
                               const StoreAskOptions& options,
-                              const std::vector<JudgedLevel>& levels);
+                              const std::vector<JudgedLevel>& levels, const AskedTime& time);
 
 /// Sends a query of the user to a server and writes the rows to standard output. Wrong usage if it
 /// is a wrong query.

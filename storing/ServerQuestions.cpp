@@ -19,6 +19,28 @@ constexpr const char* kHeld =
 constexpr const char* kValue = "(steps * step + rest)";
 constexpr const char* kCounts = "known = 1 AND hold_minutes + hold_seconds + hold_ms > 0";
 
+/// What of a row is in the asked time.
+struct Part {
+    explicit Part(const AskedTime& time) {
+        if (time.isAll()) {
+            return;
+        }
+        std::string end = formatText("(%@ + %@)", {kSince, kHeld});
+        if (time.from) {
+            since = formatText("greatest(%@, toInt64(%lld))", {kSince, *time.from});
+        }
+        if (time.to) {
+            end = formatText("least(%@, toInt64(%lld))", {end, *time.to});
+        }
+        held = formatText("(%@ - %@)", {end, since});
+        counts += formatText(" AND %@ > 0", {held});
+    }
+
+    std::string since = kSince;
+    std::string held = kHeld;
+    std::string counts = kCounts; ///< whether there is a part with a number
+};
+
 std::string fieldsOf(const JudgedLevel& level) {
     std::string texts;
     for (const std::string& field : level.fields) {
@@ -41,18 +63,18 @@ std::string isBeyond(const JudgedLevel& level, const std::string& relation,
 }
 
 /// hold, below, since and quantiles of the current values of a level.
-std::string sumsOf(const JudgedLevel& level) {
+std::string sumsOf(const JudgedLevel& level, const Part& part) {
     const std::string below =
         isBeyond(level, "<", level.border ? sqlNumber(*level.border) : "NULL");
     std::string sums = formatText(
         "nullIf(sumIf(%@, %@), 0) AS hold, sumIf(%@, %@ AND %@) AS below, if(below > 0, minIf(%@ * "
         "1000, %@ AND %@), NULL) AS since",
-        {kHeld, kCounts, kHeld, kCounts, below, kSince, kCounts, below});
+        {part.held, part.counts, part.held, part.counts, below, part.since, part.counts, below});
     for (const char* share : {"0.05", "0.5", "0.95"}) {
         sums +=
             formatText(", if(hold > 0, quantileExactWeightedIf(%@)(%@, toUInt64(%@), %@), NULL) "
                        "AS p%@",
-                       {share, kValue, kHeld, kCounts, std::string(share).substr(2)});
+                       {share, kValue, part.held, part.counts, std::string(share).substr(2)});
     }
     return sums;
 }
@@ -78,24 +100,27 @@ std::string unionOf(const std::vector<std::string>& queries) {
 }
 
 ServerQuestion cellsQuestion(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
-                             const ServerStore& store) {
+                             const AskedTime& time, const ServerStore& store) {
+    const Part part(time);
     std::vector<std::string> queries;
     for (const JudgedLevel& level : levels) {
-        queries.push_back(formatText(
-            "SELECT system, cell, %@ AS level, %@ AS border, uniqExact(device) AS devices, %@\n"
-            "FROM %@ WHERE field IN (%@) AND cell != '' AND %@%@ GROUP BY system, cell",
-            {clickHouseText(level.name),
-             level.border ? "toFloat64(" + sqlNumber(*level.border) + ")" : "NULL", sumsOf(level),
-             store.table("intervals"), fieldsOf(level), store.currentLoads(),
-             whereDevice(options)}));
+        queries.push_back(
+            formatText("SELECT system, cell, %@ AS level, %@ AS border, uniqExactIf(device, %@) AS "
+                       "devices, %@\n"
+                       "FROM %@ WHERE field IN (%@) AND cell != '' AND %@%@ GROUP BY system, cell",
+                       {clickHouseText(level.name),
+                        level.border ? "toFloat64(" + sqlNumber(*level.border) + ")" : "NULL",
+                        part.counts, sumsOf(level, part), store.table("intervals"), fieldsOf(level),
+                        store.currentLoads(), whereDevice(options)}));
     }
-    return {{{"sums",
-              std::vector<std::string>{"system", "cell", "level", "border", "devices"} +
-                  summaryColumns(),
-              unionOf(queries)}},
-            formatText("WITH judged AS (SELECT system, cell, level, border, devices, %@ AS summary "
-                       "FROM sums)\n%@",
-                       {kSummaryArray, answerOf(options)})};
+    return {
+        {{"sums",
+          std::vector<std::string>{"system", "cell", "level", "border", "devices"} +
+              summaryColumns(),
+          unionOf(queries)}},
+        "WITH judged AS (SELECT system, cell, level, border, json_array(hold, below, since, p05, "
+        "p5, p95, devices) AS summary FROM sums)\n" +
+            answerOf(options)};
 }
 
 /// Whether a row is of a device, a recording or a day with this name. `day` counts from 1970.
@@ -112,7 +137,9 @@ std::string isNamed(const std::string& word, const std::string& day) {
 }
 
 ServerQuestion compareQuestion(const StoreAskOptions& options,
-                               const std::vector<JudgedLevel>& levels, const ServerStore& store) {
+                               const std::vector<JudgedLevel>& levels, const AskedTime& time,
+                               const ServerStore& store) {
+    const Part part(time);
     std::vector<std::string> sums;
     std::vector<std::string> events;
     for (std::size_t side = 0; side < options.words.size(); ++side) {
@@ -122,14 +149,18 @@ ServerQuestion compareQuestion(const StoreAskOptions& options,
                 "SELECT %llu AS n, %llu AS side, %@ AS what, %@\nFROM %@ WHERE field IN (%@) AND "
                 "%@ AND %@%@",
                 {std::uint64_t{level + 1}, std::uint64_t{side + 1},
-                 clickHouseText(levels[level].name), sumsOf(levels[level]),
+                 clickHouseText(levels[level].name), sumsOf(levels[level], part),
                  store.table("intervals"), fieldsOf(levels[level]), store.currentLoads(),
                  isNamed(word, "day"), whereDevice(options)}));
         }
         events.push_back(formatText(
-            "SELECT %llu AS side, kind, count() AS times FROM %@ WHERE %@ AND %@%@ GROUP BY kind",
+            "SELECT %llu AS side, kind, count() AS times FROM %@ WHERE %@ AND %@%@%@%@ GROUP BY "
+            "kind",
             {std::uint64_t{side + 1}, store.table("events"), store.currentLoads(),
-             isNamed(word, "intDiv(time, 86400000000)"), whereDevice(options)}));
+             isNamed(word, "intDiv(time, 86400000000)"),
+             time.from ? formatText(" AND intDiv(time, 1000) >= %lld", {*time.from}) : "",
+             time.to ? formatText(" AND intDiv(time, 1000) < %lld", {*time.to}) : "",
+             whereDevice(options)}));
     }
     return {
         {{"sums", std::vector<std::string>{"n", "side", "what"} + summaryColumns(), unionOf(sums)},
@@ -140,20 +171,22 @@ ServerQuestion compareQuestion(const StoreAskOptions& options,
 }
 
 ServerQuestion coverageQuestion(const StoreAskOptions& options,
-                                const std::vector<JudgedLevel>& levels, const ServerStore& store) {
+                                const std::vector<JudgedLevel>& levels, const AskedTime& time,
+                                const ServerStore& store) {
+    const Part part(time);
     std::vector<std::string> queries;
     for (const JudgedLevel& level : levels) {
         std::string sums;
         for (const Grade grade : {Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor}) {
-            sums += formatText(
-                ", sumIf(%@, %@ AND %@) AS %@",
-                {kHeld, kCounts, isBeyond(level, ">=", borderOf(level, grade)), nameOf(grade)});
+            sums += formatText(", sumIf(%@, %@ AND %@) AS %@",
+                               {part.held, part.counts,
+                                isBeyond(level, ">=", borderOf(level, grade)), nameOf(grade)});
         }
-        queries.push_back(
-            formatText("SELECT device, %@ AS level, sumIf(%@, %@) AS hold%@\nFROM %@ WHERE field "
-                       "IN (%@) AND %@%@ GROUP BY device",
-                       {clickHouseText(level.name), kHeld, kCounts, sums, store.table("intervals"),
-                        fieldsOf(level), store.currentLoads(), whereDevice(options)}));
+        queries.push_back(formatText(
+            "SELECT device, %@ AS level, sumIf(%@, %@) AS hold%@\nFROM %@ WHERE field "
+            "IN (%@) AND %@%@ GROUP BY device",
+            {clickHouseText(level.name), part.held, part.counts, sums, store.table("intervals"),
+             fieldsOf(level), store.currentLoads(), whereDevice(options)}));
     }
     return {{{"sums",
               {"device", "level", "hold", "excellent", "good", "fair", "poor"},
@@ -165,10 +198,12 @@ ServerQuestion coverageQuestion(const StoreAskOptions& options,
 
 /// An interval counts in each step that it touches, with the part of its time that is there.
 ServerQuestion seriesQuestion(const StoreAskOptions& options,
-                              const std::vector<JudgedLevel>& levels, const ServerStore& store) {
+                              const std::vector<JudgedLevel>& levels, const AskedTime& time,
+                              const ServerStore& store) {
+    const Part part(time);
     const std::string step = std::to_string(stepOf(options));
-    const std::string begin = formatText("(%@ * 1000)", {kSince});
-    const std::string end = formatText("(%@ + %@ * 1000)", {begin, kHeld});
+    const std::string begin = formatText("(%@ * 1000)", {part.since});
+    const std::string end = formatText("(%@ + %@ * 1000)", {begin, part.held});
     const std::string pieces =
         formatText("WITH intDiv(%@, %@) + toInt64(arrayJoin(range(toUInt64(intDiv(%@ - 1, %@) - "
                    "intDiv(%@, %@) + 1)))) AS piece, least(%@, piece * %@ + %@) - greatest(%@, "
@@ -182,7 +217,7 @@ ServerQuestion seriesQuestion(const StoreAskOptions& options,
                        "part), max(%@), sum(part)\nFROM %@ WHERE field IN (%@) AND %@ AND "
                        "%@%@%@ GROUP BY device, entry, piece",
                        {kValue, kValue, kValue, store.table("intervals"), fieldsOf(levels.front()),
-                        kCounts, store.currentLoads(), whereDevice(options),
+                        part.counts, store.currentLoads(), whereDevice(options),
                         options.entry ? " AND entry = " + clickHouseText(*options.entry) : ""})}},
         answerOf(options)};
 }
@@ -190,17 +225,18 @@ ServerQuestion seriesQuestion(const StoreAskOptions& options,
 } // namespace
 
 ServerQuestion serverQuestion(const StoreAskOptions& options,
-                              const std::vector<JudgedLevel>& levels, const ServerStore& store) {
+                              const std::vector<JudgedLevel>& levels, const AskedTime& time,
+                              const ServerStore& store) {
     using Question = StoreAskOptions::Question;
     switch (options.question) {
     case Question::Cells:
-        return cellsQuestion(options, levels, store);
+        return cellsQuestion(options, levels, time, store);
     case Question::Series:
-        return seriesQuestion(options, levels, store);
+        return seriesQuestion(options, levels, time, store);
     case Question::Compare:
-        return compareQuestion(options, levels, store);
+        return compareQuestion(options, levels, time, store);
     case Question::Coverage:
-        return coverageQuestion(options, levels, store);
+        return coverageQuestion(options, levels, time, store);
     default:
         return {{}, answerOf(options)}; // on `recordings`, which is always there
     }

@@ -24,6 +24,7 @@ struct ServerQuestion {
 
 /// Of any question but Sql.
 ServerQuestion serverQuestion(const StoreAskOptions& options,
-                              const std::vector<JudgedLevel>& levels, const ServerStore& store);
+                              const std::vector<JudgedLevel>& levels, const AskedTime& time,
+                              const ServerStore& store);
 
 } // namespace pallax

@@ -5,6 +5,7 @@
 #include "knowledge/Quality.h"
 #include "querying/RowWriter.h"
 #include "store/RecordingMeasurements.h"
+#include "text/TimeText.h"
 
 #include <chrono>
 #include <optional>
@@ -42,11 +43,11 @@ struct StoreSetupOptions {
 
 /// `pallax store query`.
 struct StoreAskOptions {
-    enum class Question { Devices, Recordings, Cells, Series, Compare, Coverage, Sql };
+    enum class Question { Devices, Recordings, Cells, Series, Section, Compare, Coverage, Sql };
 
     std::string store; ///< as for loading
     Question question = Question::Sql;
-    /// The field of a series, the two that are compared, or the query.
+    /// The field of a series, the name of a section, the two that are compared, or the query.
     std::vector<std::string> words = {};
     std::optional<std::string> device = {};
     std::string levels = {};          ///< a field or a measure; empty: of the serving cells
@@ -54,6 +55,8 @@ struct StoreAskOptions {
     std::string profile{kDefaultProfile};
     std::chrono::nanoseconds every = std::chrono::minutes(1); ///< of a series
     std::optional<std::string> entry = {};                    ///< of a series
+    std::optional<TimeText> from = {}; ///< of what the store has, of the device if there is one
+    std::optional<TimeText> to = {};
     RowFormat format = RowFormat::Table;
     std::optional<std::chrono::nanoseconds> timeout = {};
 };

@@ -165,6 +165,88 @@ TEST_F(EndToEndStore, AnswersQuestions) {
               "left out,0.2.0,\n");
 }
 
+TEST_F(EndToEndStore, TimesLimitQuestions) {
+    const std::string file = world.path("s.db");
+    ASSERT_EQ(run({"store", "load", "--into", file, "--device", "car1", drive}).status, 0);
+    const auto ask = [&](std::vector<std::string> words) {
+        std::vector<std::string> arguments{"store", "query", "--store", file, "--format", "csv"};
+        arguments.insert(arguments.end(), words.begin(), words.end());
+        return run(arguments);
+    };
+    EXPECT_EQ(ask({"series", "measured_rsrp", "--from", "2023-11-14T22:14:30Z", "--to",
+                   "2023-11-14T22:15:10Z"})
+                  .out,
+              "time,device,entry,least,mean,greatest,known_percent\n"
+              "2023-11-14T22:14:00.000Z,car1,,-94.5,-91.21,-85,23.4\n"
+              "2023-11-14T22:15:00.000Z,car1,,-96.25,-92.61,-86.75,13.3\n");
+    EXPECT_EQ(
+        ask({"cells", "--level", "rsrp", "--below", "-90", "--from", "+100s"}).out,
+        "system,cell,level,devices,hours,border,below_percent,since,p5,p50,p95\n"
+        "lte,\"PCI 286, EARFCN 1850\",LTE RSRP,1,0.001,-90,100,2023-11-14T22:15:16.036Z,-94.5,"
+        "-94.5,-90.5\n"
+        "lte,\"PCI 82, EARFCN 1850\",LTE RSRP,1,0.004,-90,87.5,2023-11-14T22:15:00.036Z,-97.5,"
+        "-95.75,-86.75\n");
+    const Run reversed = ask({"cells", "--from", "end", "--to", "start"});
+    EXPECT_EQ(reversed.status, 1);
+    EXPECT_EQ(reversed.err, "pallax: the time of --from is later than that of --to.\n");
+    const Run outside = ask({"cells", "--from", "03:00"});
+    EXPECT_EQ(outside.status, 1);
+    EXPECT_EQ(outside.out, "");
+}
+
+TEST_F(EndToEndStore, ASectionHasARowForEachInstant) {
+    const std::string file = world.path("s.db");
+    ASSERT_EQ(run({"store", "load", "--into", file, "--device", "car1", drive}).status, 0);
+    const auto section = [&](std::vector<std::string> words) {
+        std::vector<std::string> arguments{"store", "query", "section",  "--store", file,
+                                           "--to",  "+20s",  "--format", "csv"};
+        arguments.insert(arguments.end(), words.begin(), words.end());
+        return run(arguments);
+    };
+    EXPECT_EQ(section({"lte.reselection_candidates"}).out,
+              "time,device,recording,system,cell,seconds,version,serving_earfcn,serving_cell_id\n"
+              "2023-11-14T22:13:22.036Z,car1,lte-drive.pcap,lte,\"PCI 182, EARFCN 1850\",14,1,1850,"
+              "182\n"
+              "2023-11-14T22:13:36.036Z,car1,lte-drive.pcap,lte,\"PCI 183, EARFCN 1850\",18,1,1850,"
+              "182\n");
+    EXPECT_EQ(
+        section({"serving_cell_info"}).out,
+        "time,device,recording,system,cell,seconds,physical_cell_id,download_frequency,"
+        "upload_frequency,download_bandwidth,upload_bandwidth,cell_identity,"
+        "tracking_area_code,freq_band_indicator,num_tx_antennas,uarfcn\n"
+        "2023-11-14T22:13:22.036Z,car1,lte-drive.pcap,lte,\"PCI 182, EARFCN 1850\",2,182,1850,"
+        "19850,20 MHz,20 MHz,26743041,6701,3,2,\n"
+        "2023-11-14T22:13:24.036Z,car1,lte-drive.pcap,lte,\"PCI 182, EARFCN 1850\",12,182,1850,"
+        "19850,20 MHz,20 MHz,26743041,6701,3,2,1850\n"
+        "2023-11-14T22:13:36.036Z,car1,lte-drive.pcap,lte,\"PCI 183, EARFCN 1850\",8,183,1850,"
+        "19850,20 MHz,20 MHz,26744321,6699,3,2,\n");
+    EXPECT_EQ(section({"serving_cel_info"}).err,
+              "pallax: No section of the store is named \"serving_cel_info\". Did you mean "
+              "\"serving_cell_info\"?\n");
+    EXPECT_EQ(run({"store", "query", "--store", file, "--format", "csv", "--sql",
+                   "select count(*) as n from lte.serving_cell_info where device = 'car1'"})
+                  .out,
+              "n\n11\n");
+    EXPECT_FALSE(std::filesystem::exists(file + "-wal")) << "nothing is left beside it";
+}
+
+TEST_F(EndToEndStore, LabelsOfAllTechnologiesAreThere) {
+    const std::string file = world.path("s.db");
+    ASSERT_EQ(run({"store", "load", "--into", file, drive, sample("umts-drive.pcap")}).status, 0);
+    const auto label = [&](const std::string& arguments) {
+        return run({"store", "query", "--store", file, "--format", "csv", "--sql",
+                    "select label(" + arguments + ") as label"});
+    };
+    EXPECT_EQ(label("'download_bandwidth', 100").out, "label\n20 MHz\n");
+    EXPECT_EQ(label("'utran.rrc_info.state', 3").out,
+              run({"sql", "--format", "csv", sample("umts-drive.pcap"),
+                   "select label('rrc_info.state', 3) as label"})
+                  .out);
+    EXPECT_EQ(label("'download_bandwith', 100").err,
+              "pallax: \"download_bandwith\" is not a field. Did you mean "
+              "\"download_bandwidth\"?\n");
+}
+
 TEST_F(EndToEndStore, QueriesOfRecordingsRunUnchanged) {
     const std::string recording = world.path("umts.pcap");
     ASSERT_EQ(run({"simulate", "utran", "--seconds", "200", "-o", recording}).status, 0);

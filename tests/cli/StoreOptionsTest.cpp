@@ -48,6 +48,10 @@ TEST(StoreOptions, QueryTakesAQuestion) {
     EXPECT_EQ(cells.profile, "field");
     EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "compare", "a", "b"}).words,
               (std::vector<std::string>{"a", "b"}));
+    const auto section = parsed<StoreAskOptions>(
+        {"store", "query", "section", "lte.x", "--entry", "PCI 1", "--from", "start"});
+    EXPECT_EQ(section.question, Question::Section);
+    EXPECT_EQ(section.words, std::vector<std::string>{"lte.x"});
     EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "devices"}).question, Question::Devices);
     EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "recordings"}).question,
               Question::Recordings);
@@ -55,6 +59,43 @@ TEST(StoreOptions, QueryTakesAQuestion) {
     const auto sql = parsed<StoreAskOptions>({"store", "query", "--sql", "select 1"});
     EXPECT_EQ(sql.question, Question::Sql);
     EXPECT_EQ(sql.words, std::vector<std::string>{"select 1"});
+}
+
+TEST(StoreOptions, TimesLimitQuestions) {
+    for (const char* question : {"cells", "coverage"}) {
+        const auto limited = parsed<StoreAskOptions>(
+            {"store", "query", question, "--from", "2026-11-20T14:00Z", "--to", "end"});
+        EXPECT_TRUE(limited.from && limited.from->isAbsolute());
+        EXPECT_TRUE(limited.to && limited.to->isEnd());
+    }
+    EXPECT_EQ(refusal({"store", "query", "cells", "--from", "noon"}).substr(0, 23),
+              "pallax: --from: \"noon\" ");
+}
+
+TEST(StoreOptions, WhatAnActionDoesNotTakeIsRefused) {
+    const auto says = [](std::vector<std::string> arguments, const std::string& expected) {
+        arguments.insert(arguments.begin(), "store");
+        EXPECT_EQ(refusal(std::move(arguments)),
+                  "pallax: " + expected + " (see pallax store --help)\n");
+    };
+    says({"load", "a", "--format", "csv"}, "load takes no --format");
+    says({"load", "a", "--below", "-110"}, "load takes no --below");
+    says({"load", "a", "--from", "start"}, "load takes no --from");
+    says({"load", "a", "--sql"}, "load takes no --sql");
+    says({"load", "a", "--every", "1m"}, "load: --every takes tick or packet");
+    says({"watch", "a", "--jobs", "2"}, "watch takes no --jobs");
+    says({"watch", "a", "--timeout", "2"}, "watch takes no --timeout");
+    says({"query", "devices", "--jobs", "2"}, "devices takes no --jobs");
+    says({"query", "devices", "--to", "end"}, "devices takes no --to");
+    says({"query", "recordings", "--profile", "field"}, "recordings takes no --profile");
+    says({"query", "cells", "--pseudonyms", "key"}, "cells takes no --pseudonyms");
+    says({"query", "cells", "--entry", "PCI 1"}, "cells takes no --entry");
+    says({"query", "cells", "--every", "1m"}, "cells takes no --every");
+    says({"query", "series", "rsrp", "--every", "packet"},
+         "series: --every takes a time (30s, 1m, 6h, 1d)");
+    says({"query", "series", "rsrp", "--level", "rsrp"}, "series takes no --level");
+    says({"query", "coverage", "--below", "-110"}, "coverage takes no --below");
+    says({"query", "--sql", "select 1", "--device", "car1"}, "--sql takes no --device");
 }
 
 TEST(StoreOptions, WatchTakesAFolder) {
@@ -70,15 +111,19 @@ TEST(StoreOptions, WrongOnesAreToldInASentence) {
               "pallax: load takes recordings (see pallax store --help)\n");
     EXPECT_EQ(refusal({"store", "load", "--device", "", "a"}),
               "pallax: a device has a name (see pallax store --help)\n");
-    EXPECT_EQ(refusal({"store", "query"}),
-              "pallax: query takes a question (devices|recordings|cells|series|compare|coverage) "
-              "or --sql (see pallax store --help)\n");
-    EXPECT_EQ(refusal({"store", "query", "cell"}),
-              "pallax: query: \"cell\" is not one of "
-              "devices|recordings|cells|series|compare|coverage. Did you mean \"cells\"? (see "
-              "pallax store --help)\n");
+    EXPECT_EQ(
+        refusal({"store", "query"}),
+        "pallax: query takes a question (devices|recordings|cells|series|section|compare|coverage) "
+        "or --sql (see pallax store --help)\n");
+    EXPECT_EQ(
+        refusal({"store", "query", "cell"}),
+        "pallax: query: \"cell\" is not one of "
+        "devices|recordings|cells|series|section|compare|coverage. Did you mean \"cells\"? (see "
+        "pallax store --help)\n");
     EXPECT_EQ(refusal({"store", "query", "series"}),
               "pallax: series takes a field (see pallax store --help)\n");
+    EXPECT_EQ(refusal({"store", "query", "section"}),
+              "pallax: section takes the name of a section (see pallax store --help)\n");
     EXPECT_EQ(refusal({"store", "query", "compare", "a"}),
               "pallax: compare takes two words (see pallax store --help)\n");
     EXPECT_EQ(refusal({"store", "query", "devices", "a"}),

@@ -56,6 +56,8 @@ TEST_F(RecordingLoadTest, ANewerDecoderReplacesItAndAnOlderOneDoesNot) {
     EXPECT_EQ(load(path).kind, Kind::Replaced);
     EXPECT_EQ(ask("SELECT DISTINCT decoder FROM measurement"), std::vector<std::string>{"1.0.10"});
     EXPECT_EQ(ask("SELECT count(*) FROM recordings"), std::vector<std::string>{"1"});
+    EXPECT_EQ(ask("SELECT count(*) FROM totals WHERE recording NOT IN (SELECT id FROM recordings)"),
+              std::vector<std::string>{"0"});
     bundle.bundleVersion = "1.0.9";
     const LoadOutcome older = load(path);
     EXPECT_EQ(older.kind, Kind::Skipped);

@@ -59,6 +59,9 @@ protected:
               "first, last, trouble FROM recordings ORDER BY digest",
               "SELECT * FROM measurement ORDER BY recording, field, entry, start, packet, hold, "
               "text",
+              "SELECT f.name, p.identity, r.digest, t.number, t.hold, t.first FROM totals t JOIN "
+              "fields f ON f.id = t.field JOIN recordings r ON r.id = t.recording LEFT JOIN sites "
+              "p ON p.id = t.site ORDER BY 1, 2, 3, 4",
               "SELECT * FROM event ORDER BY recording, time, kind, words",
               "SELECT * FROM cell ORDER BY recording, role, system, identity",
               "SELECT * FROM field ORDER BY name"}) {
