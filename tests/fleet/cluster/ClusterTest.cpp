@@ -69,7 +69,11 @@ TEST_F(Cluster, AnswersAsAFileDoes) {
              {"compare", "lte-drive.pcap", "2023-11-14", "--level", "rsrp"},
              {"compare", "car1", "nothing"},
              {"coverage"},
-             {"coverage", "--device", "car1", "--profile", "field"}}) {
+             {"coverage", "--device", "car1", "--profile", "field"},
+             {"cells", "--from", "+20s", "--to", "-10s"},
+             {"series", "lte.serving_cell_measurements.measured_rsrp", "--from", "+5s"},
+             {"compare", "car1", "car5", "--to", "+40s"},
+             {"coverage", "--device", "car1", "--from", "+20s", "--to", "+25s"}}) {
         const std::string expected = answer(file, words);
         EXPECT_EQ(answer(store, words), expected) << words.front();
         EXPECT_GT(std::count(expected.begin(), expected.end(), '\n'), 1) << words.front();

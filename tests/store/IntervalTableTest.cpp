@@ -1,6 +1,6 @@
-#include "store/IntervalWriter.h"
+#include "store/IntervalTable.h"
 
-#include "store/MeasurementStore.h"
+#include "store/FileStore.h"
 #include "tests/store/StoreFixture.h"
 
 #include <gtest/gtest.h>
@@ -11,9 +11,9 @@ namespace {
 using std::chrono::milliseconds;
 
 /// Intervals with values that a drive has shown.
-class IntervalWriterTest : public StoreFixture {
+class IntervalTableTest : public StoreFixture {
 protected:
-    IntervalWriterTest()
+    IntervalTableTest()
         : _measurements(source(), Resolution::Tick,
                         [this](const Interval& interval) { _shown.push_back(interval); }) {
         drive(1, std::chrono::seconds(60));
@@ -41,10 +41,10 @@ protected:
         return {};
     }
     void write() {
-        MeasurementStore store(file);
+        FileStore store(file);
         StoreConnection::Transaction transaction(store.connection());
         NamedRows names(store.connection());
-        writer.write(store.connection(), 1, names);
+        writeIntervals(batch, store.connection(), 1, names);
         transaction.commit();
     }
 
@@ -58,13 +58,13 @@ private:
     RecordingMeasurements _measurements;
 
 protected:
-    IntervalWriter writer{_measurements, kFirst};
+    IntervalBatch batch{_measurements, kFirst};
 };
 
-TEST_F(IntervalWriterTest, TheRowsOfASeriesAreTogetherInTheOrderOfTheirTimes) {
-    writer.add(interval(kPci, 2000, 10));
-    writer.add(interval(kRsrp, 1000, 20));
-    writer.add(interval(kPci, 0, 30));
+TEST_F(IntervalTableTest, TheRowsOfASeriesAreTogetherInTheOrderOfTheirTimes) {
+    batch.add(interval(kPci, 2000, 10));
+    batch.add(interval(kRsrp, 1000, 20));
+    batch.add(interval(kPci, 0, 30));
     write();
     EXPECT_EQ(ask("SELECT id, time, hold, packet FROM intervals"),
               (std::vector<std::string>{"1|0|30|7", "2|2000|10|7", "3|1000|20|7"}));
@@ -74,9 +74,9 @@ TEST_F(IntervalWriterTest, TheRowsOfASeriesAreTogetherInTheOrderOfTheirTimes) {
                                         std::string(kRsrp) + "|3|3|1000|1020|NULL|NULL"}));
 }
 
-TEST_F(IntervalWriterTest, ALevelIsAWholeNumberOfSixteenths) {
+TEST_F(IntervalTableTest, ALevelIsAWholeNumberOfSixteenths) {
     const Interval level = interval(kRsrp, 0, 10);
-    writer.add(level);
+    batch.add(level);
     write();
     EXPECT_EQ(
         ask("SELECT typeof(i.number), i.number * s.step, step, format, text FROM intervals i, "
@@ -85,24 +85,24 @@ TEST_F(IntervalWriterTest, ALevelIsAWholeNumberOfSixteenths) {
                                  "|0.062500|%4.2f dBm|NULL"});
 }
 
-TEST_F(IntervalWriterTest, ALabelIsATextWithItsNumberInTheRecord) {
-    writer.add(interval(kBandwidth, 0, 10));
-    writer.add(interval(kBandwidth, 10, 10));
+TEST_F(IntervalTableTest, ALabelIsATextWithItsNumberInTheRecord) {
+    batch.add(interval(kBandwidth, 0, 10));
+    batch.add(interval(kBandwidth, 10, 10));
     write();
     EXPECT_EQ(ask("SELECT i.number, t.text, t.raw FROM intervals i JOIN texts t ON t.id = i.text"),
               (std::vector<std::string>{"NULL|20 MHz|100", "NULL|20 MHz|100"}));
     EXPECT_EQ(ask("SELECT count(*) FROM texts"), std::vector<std::string>{"1"});
 }
 
-TEST_F(IntervalWriterTest, TheFirstPartOfADividedValueHasTheWholeTime) {
+TEST_F(IntervalTableTest, TheFirstPartOfADividedValueHasTheWholeTime) {
     Interval first = interval(kPci, 0, 10);
     first.part = Interval::Part::First;
     first.whole = milliseconds(25);
     Interval second = interval(kPci, 10, 15);
     second.part = Interval::Part::Continued;
-    writer.add(first);
-    writer.add(second);
-    writer.add(interval(kPci, 25, 5));
+    batch.add(first);
+    batch.add(second);
+    batch.add(interval(kPci, 25, 5));
     write();
     EXPECT_EQ(ask("SELECT hold, whole FROM intervals"),
               (std::vector<std::string>{"10|25", "15|-1", "5|NULL"}));
@@ -111,36 +111,36 @@ TEST_F(IntervalWriterTest, TheFirstPartOfADividedValueHasTheWholeTime) {
         << "of a recording that is not there";
 }
 
-TEST_F(IntervalWriterTest, CellsHaveSeriesOfTheirOwn) {
+TEST_F(IntervalTableTest, CellsHaveSeriesOfTheirOwn) {
     Interval other = interval(kPci, 10, 10);
     other.cell = 0;
-    writer.add(interval(kPci, 0, 10));
-    writer.add(other);
+    batch.add(interval(kPci, 0, 10));
+    batch.add(other);
     write();
     EXPECT_EQ(ask("SELECT site IS NULL, first_row FROM series ORDER BY id"),
               (std::vector<std::string>{"1|1", "0|2"}));
     EXPECT_EQ(ask("SELECT count(*) FROM sites"), std::vector<std::string>{"1"});
 }
 
-TEST_F(IntervalWriterTest, WhatIsWrittenLaterComesAfterwards) {
-    writer.add(interval(kPci, 0, 10));
+TEST_F(IntervalTableTest, WhatIsWrittenLaterComesAfterwards) {
+    batch.add(interval(kPci, 0, 10));
     write();
-    EXPECT_EQ(writer.count(), 1U);
-    writer.add(interval(kPci, 10, 10));
+    EXPECT_EQ(batch.count(), 1U);
+    batch.add(interval(kPci, 10, 10));
     write();
-    EXPECT_EQ(writer.count(), 2U);
+    EXPECT_EQ(batch.count(), 2U);
     write(); // nothing
     EXPECT_EQ(ask("SELECT first_row, last_row FROM series"),
               (std::vector<std::string>{"1|1", "2|2"}));
 }
 
-TEST_F(IntervalWriterTest, IsFullAtItsLimit) {
+TEST_F(IntervalTableTest, IsFullAtItsLimit) {
     const Interval one = interval(kPci, 0, 1);
-    for (std::size_t count = 0; count < IntervalWriter::kMostKept; ++count) {
-        ASSERT_FALSE(writer.isFull());
-        writer.add(one);
+    for (std::size_t count = 0; count < IntervalBatch::kMostKept; ++count) {
+        ASSERT_FALSE(batch.isFull());
+        batch.add(one);
     }
-    EXPECT_TRUE(writer.isFull());
+    EXPECT_TRUE(batch.isFull());
 }
 
 } // namespace
