@@ -21,6 +21,7 @@
 
 #include <cerrno>
 #include <cstring>
+#include <filesystem>
 #include <unistd.h>
 
 namespace pallax {
@@ -53,6 +54,10 @@ std::optional<std::string> refusalOf(const ReportOptions& options) {
         return outputIntoRecording(options.recordings);
     }
     std::error_code ignored;
+    if (!options.store.empty() &&
+        std::filesystem::equivalent(options.store, options.output, ignored)) {
+        return formatText("%@ would be replaced by its report.", {options.output});
+    }
     if (recordingAmong(options.recordings, regularFile(options.output))) {
         return formatText("%@ would be replaced by its report.", {options.output});
     }
