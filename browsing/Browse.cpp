@@ -8,11 +8,11 @@
 #include "console/ScopedLog.h"
 #include "console/TeeSink.h"
 #include "decoding/FatalRecord.h"
+#include "decoding/InstalledKnowledge.h"
 #include "decoding/Preconditions.h"
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "host/JoinedRecording.h"
-#include "host/KnowledgeFiles.h"
 #include "host/LogSinks.h"
 #include "host/RecordingParts.h"
 #include "link/Settings.h"
@@ -167,10 +167,10 @@ ExitStatus runBrowse(const BrowseOptions& wanted) {
         return kExitFailure;
     }
     const std::string usual = settings->profile.value_or(std::string(kDefaultProfile));
-    auto profile = loadProfile(options.profile.value_or(usual), profileFolder());
+    auto profile =
+        profileOrComplaint({options.profile.value_or(usual), options.profile.has_value()});
     if (!profile) {
-        complain(profile.error().sentence);
-        return options.profile && profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+        return profile.error();
     }
     const Request request{options, *settings, std::move(profile).value(),
                           options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord,

@@ -4,7 +4,6 @@
 #include "decoding/RequiredTemplates.h"
 #include "host/Complaint.h"
 #include "host/DirectoryResources.h"
-#include "host/KnowledgeFiles.h"
 #include "host/MonotonicClock.h"
 #include "host/WallClock.h"
 #include "platform/RecordedTechnology.h"
@@ -247,11 +246,9 @@ ExitStatus runStoreAsk(const StoreAskOptions& options) {
         complain(*refusal);
         return kExitFailure;
     }
-    const auto profile = loadProfile(options.profile, profileFolder());
+    const auto profile = profileOrComplaint({options.profile, true, "store"});
     if (!profile) {
-        complain(profile.error().sentence +
-                 (profile.error().isUnknown ? " (see pallax store --help)" : ""));
-        return profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+        return profile.error();
     }
     return Ask(options, file, *profile).run();
 }

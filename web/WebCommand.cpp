@@ -1,6 +1,7 @@
 #include "web/WebCommand.h"
 
 #include "console/Output.h"
+#include "decoding/InstalledKnowledge.h"
 #include "decoding/RequiredTemplates.h"
 #include "host/AsioMainQueue.h"
 #include "host/BuildBundle.h"
@@ -60,19 +61,6 @@ std::optional<std::string> readPem(const std::string& path) {
         return std::nullopt;
     }
     return std::string(content->begin(), content->end());
-}
-
-/// Nothing after a complaint.
-std::optional<QualityProfile> profileOf(const WebOptions& options, const Settings& settings,
-                                        ExitStatus& status) {
-    const std::string usual = settings.profile.value_or(std::string(kDefaultProfile));
-    auto profile = loadProfile(options.profile.value_or(usual), profileFolder());
-    if (!profile) {
-        complain(profile.error().sentence);
-        status = options.profile && profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
-        return std::nullopt;
-    }
-    return std::move(profile).value();
 }
 
 RequestGate gateOf(const WebOptions& options, const Listener& listener) {
@@ -221,10 +209,11 @@ ExitStatus runWeb(const WebOptions& options) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
-    ExitStatus status = kExitSuccess;
-    const auto profile = profileOf(options, *settings, status);
+    const std::string usual = settings->profile.value_or(std::string(kDefaultProfile));
+    const auto profile =
+        profileOrComplaint({options.profile.value_or(usual), options.profile.has_value()});
     if (!profile) {
-        return status;
+        return profile.error();
     }
     return options.store.empty() ? serve(options, *settings, *profile)
                                  : serveStored(options, *profile);
