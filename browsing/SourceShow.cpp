@@ -2,10 +2,10 @@
 
 #include "console/ScopedLog.h"
 #include "console/TeeSink.h"
+#include "decoding/InstalledKnowledge.h"
 #include "decoding/Preconditions.h"
 #include "host/Complaint.h"
 #include "host/JoinedRecording.h"
-#include "host/KnowledgeFiles.h"
 #include "host/LogSinks.h"
 #include "host/RecordingParts.h"
 #include "link/SourceChild.h"
@@ -94,10 +94,10 @@ ExitStatus showSource(const BrowseOptions& wanted, const ShowSource& show) {
         return kExitFailure;
     }
     const std::string usual = settings->profile.value_or(std::string(kDefaultProfile));
-    auto profile = loadProfile(options.profile.value_or(usual), profileFolder());
+    auto profile =
+        profileOrComplaint({options.profile.value_or(usual), options.profile.has_value()});
     if (!profile) {
-        complain(profile.error().sentence);
-        return options.profile && profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+        return profile.error();
     }
     const ShowRequest request{options, *settings, std::move(profile).value(),
                               options.keepGoing ? OnFatalRecord::Skip : settings->onFatalRecord};

@@ -57,6 +57,7 @@ constexpr const char* kReportFooter = R"(Examples:
   pallax report before.pcap after.pcap -o compared.html
   pallax report --from 14:02 --to 14:30 --track walk.gpx drive.pcap -o walk.html
   pallax report --json drive.pcap | jq '.measures[].quantiles'
+  pallax report --store fleet.db --device car1 --from 2026-11-20 -o car1.html
 
 The page is one file that any browser opens, without a network: a verdict on
 each level, curves, the cells and states over time, neighbours, events, and the
@@ -81,6 +82,11 @@ Where the clock was set back, the page shows each stretch of time by itself.
 ticks for which it holds. --track draws the way that a GPX file describes,
 without a map. --json prints an object for each recording, with times in
 seconds since 1970.
+
+With --store, the page shows what a store of measurements (see pallax store)
+holds of a device, all recordings of one technology as one. A store does not
+hold the display, so the page has no state at each tick, and says so.
+Identities and their pseudonyms stay out.
 
 The same input gives the same bytes. The page can be read by you alone. It
 appears when it is complete.
@@ -144,18 +150,33 @@ void addReport(CLI::App& app, ReportOptions& options) {
         ->type_name("android|field|operator|NAME");
     addTime(app, "--from", options.from, "Begin at this time");
     addTime(app, "--to", options.to, "End at this time");
-    app.add_option("--where", options.where, "Only the display ticks for which this holds")
-        ->type_name("CONDITION");
+    CLI::Option* where =
+        app.add_option("--where", options.where, "Only the display ticks for which this holds")
+            ->type_name("CONDITION");
     app.add_option("--title", options.title, "The title of the page")->type_name("TEXT");
     app.add_option("--label", options.labels, "What the device is called, once for each recording")
         ->type_name("TEXT")
         ->allow_extra_args(false);
     app.add_option("--track", options.track, "Draw the way in this GPX file")->type_name("FILE");
-    app.add_flag("--with-identities", options.withIdentities,
-                 "Keep what identifies a person, and say so");
-    app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
-        ->required()
-        ->type_name("");
+    CLI::Option* identities = app.add_flag("--with-identities", options.withIdentities,
+                                           "Keep what identifies a person, and say so");
+    CLI::Option* store =
+        app.add_option("--store", options.store, "Report what this store holds of a device instead")
+            ->type_name("FILE");
+    app.add_option("--device", options.device, "The device of the store (default: the only one)")
+        ->type_name("NAME")
+        ->needs(store);
+    CLI::Option* recordings =
+        app.add_option("RECORDING", options.recordings, "Recordings (pcap or pcapng)")
+            ->type_name("");
+    for (CLI::Option* option : {recordings, where, identities}) {
+        store->excludes(option);
+    }
+    app.callback([store, recordings] {
+        if (store->empty() && recordings->empty()) {
+            throw CLI::RequiredError("RECORDING or --store");
+        }
+    });
     app.footer(kReportFooter);
 }
 

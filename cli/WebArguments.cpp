@@ -18,12 +18,15 @@ constexpr const char* kWebFooter = R"(Examples:
   pallax web demo lte                  a simulated modem
   pallax web --connect car1 --open     the modem of a service, in the browser
   pallax web --port 8080 --metrics     also for a collector of metrics
+  pallax web --store fleet.db --device car1
 
 Prints a link and serves a page at it until Ctrl-C: what pallax report shows,
 while it happens. The page says what the serving cell was and is, draws levels
 and neighbours, lists events, and has the whole state at any time since then.
 A recording is played at its own pace; --speed max shows all of it at once. A
 recording with the name "demo" needs its folder (pallax web ./demo).
+
+With --store, the page is that of pallax report --store, made once at the start.
 
 The link holds a secret, which is new at each start and without which nothing
 is served. Only programs of this machine can connect. From another machine,
@@ -96,6 +99,22 @@ void addListening(CLI::App& app, WebOptions& options) {
                  "Serve /metrics to programs of this machine, without the link's secret");
 }
 
+/// --store, and what says which part of it is shown.
+CLI::Option* addStoreOf(CLI::App& app, WebOptions& options) {
+    CLI::Option* store =
+        app.add_option("--store", options.store, "Show what this store holds of a device instead")
+            ->type_name("FILE");
+    app.add_option("--device", options.device, "The device of the store (default: the only one)")
+        ->type_name("NAME")
+        ->needs(store);
+    addTechnology(app, "--technology", options.technology,
+                  "The technology of the device's recordings (default: the only one)");
+    app.get_option("--technology")->needs(store);
+    addTime(app, "--from", options.from, "Begin at this time of the store")->needs(store);
+    addTime(app, "--to", options.to, "End at this time of the store")->needs(store);
+    return store;
+}
+
 } // namespace
 
 void addWeb(CLI::App& app, WebOptions& options) {
@@ -115,16 +134,24 @@ void addWeb(CLI::App& app, WebOptions& options) {
         },
         "The live modem of the service that has this name");
     connect->excludes(source)->type_name("NAME");
+    CLI::Option* store = addStoreOf(app, options);
     addListening(app, options);
     app.add_flag("--open", options.open, "Open the page in the browser (xdg-open)");
     app.add_option("--profile", options.profile,
                    "The profile that judges levels (default: android, or that of pallax.conf)")
         ->type_name("android|field|operator|NAME");
-    app.add_flag("--with-identities", options.withIdentities,
-                 "Do not mask what identifies a person");
+    CLI::Option* identities = app.add_flag("--with-identities", options.withIdentities,
+                                           "Do not mask what identifies a person");
     CLI::Option* speed = addSpeed(app, options.play);
     CLI::App& demo = addDemo(app, options);
-    app.callback([&demo, source, connect, speed] {
+    CLI::Option* metrics = app.get_option("--metrics");
+    for (CLI::Option* option : {source, connect, speed, identities, metrics}) {
+        store->excludes(option);
+    }
+    app.callback([&demo, source, connect, speed, store] {
+        if (demo.parsed() && !store->empty()) {
+            throw CLI::ValidationError("demo", "it is shown alone, without a store");
+        }
         if (demo.parsed() && !(source->empty() && connect->empty())) {
             throw CLI::ValidationError("demo", "it is shown alone, without another source");
         }

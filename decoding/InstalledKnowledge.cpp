@@ -28,4 +28,15 @@ QueryKnowledge installedKnowledge() {
             }};
 }
 
+Result<QualityProfile, ExitStatus> profileOrComplaint(const ProfileChoice& choice) {
+    auto profile = loadProfile(choice.name, profileFolder());
+    if (profile) {
+        return std::move(profile).value();
+    }
+    const NoProfile& none = profile.error();
+    const bool hasHelp = none.isUnknown && !choice.command.empty();
+    complain(none.sentence + (hasHelp ? " (see pallax " + choice.command + " --help)" : ""));
+    return none.isUnknown && choice.isOfUser ? kExitWrongUsage : kExitFailure;
+}
+
 } // namespace pallax

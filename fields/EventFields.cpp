@@ -2,6 +2,7 @@
 
 #include "fields/ServingCells.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 
@@ -134,6 +135,12 @@ constexpr std::array<std::string_view, 12> kWords{
 
 std::string_view wordOf(EventKind kind) {
     return kWords.at(static_cast<std::size_t>(kind));
+}
+
+std::optional<EventKind> eventKindNamed(std::string_view word) {
+    const auto found = std::find(kWords.begin(), kWords.end(), word);
+    return found != kWords.end() ? std::optional(static_cast<EventKind>(found - kWords.begin()))
+                                 : std::nullopt;
 }
 
 std::span<const EventFields> eventFields() {

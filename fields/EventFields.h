@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <span>
 #include <string_view>
 
@@ -22,6 +23,8 @@ enum class EventKind {
 
 /// "cell-change": one word, for tables and programs.
 std::string_view wordOf(EventKind kind);
+
+std::optional<EventKind> eventKindNamed(std::string_view word);
 
 /// Which fields of a technology make an event. Texts and tables live as long as the program.
 struct EventFields {

@@ -3,6 +3,7 @@
 #include "LogGenerator/Technologies/Technologies.h"
 #include "console/Output.h"
 #include "decoding/DroppedNotices.h"
+#include "decoding/InstalledKnowledge.h"
 #include "decoding/RequiredTemplates.h"
 #include "fields/Reference.h"
 #include "host/BuildBundle.h"
@@ -101,11 +102,9 @@ ExitStatus runStatus(const StatusOptions& options) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
-    const auto profile = loadProfile(options.profile, profileFolder());
+    const auto profile = profileOrComplaint({options.profile, true, "status"});
     if (!profile) {
-        complain(profile.error().sentence +
-                 (profile.error().isUnknown ? " (see pallax status --help)" : ""));
-        return profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+        return profile.error();
     }
     const InstalledNames installed = readInstalledNames(dataFolders());
     for (const std::string& complaint : installed.complaints) {

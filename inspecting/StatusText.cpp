@@ -6,6 +6,7 @@
 #include "text/Printable.h"
 #include "text/Utf8.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace pallax {
@@ -148,9 +149,10 @@ Row StatusRows::cellRow(const StatusCell& cell) const {
 Row StatusRows::levelRow() const {
     Row row{"levels"};
     bool isGraded = false;
-    for (const StatusCell& cell : _status.cells) {
+    const auto add = [&](const StatusCell& cell, std::size_t from, std::size_t to) {
         std::vector<const StatusValue*> values;
-        for (const StatusValue& level : cell.levels) {
+        for (std::size_t place = from; place < std::min(to, cell.levels.size()); ++place) {
+            const StatusValue& level = cell.levels[place];
             std::string text = systemOf(cell) + level.name + " " + level.text;
             if (level.grade) {
                 text.append(" ").append(qualityWord(level));
@@ -160,6 +162,14 @@ Row StatusRows::levelRow() const {
             values.push_back(&level);
         }
         row.add(oldAgeWords(_status.time, values));
+    };
+    // The first one of a cell is its strength. The end of the row may be cut off.
+    const std::size_t first = _status.cells.size() > 1 ? 1 : 0;
+    for (const StatusCell& cell : _status.cells) {
+        add(cell, 0, first);
+    }
+    for (const StatusCell& cell : _status.cells) {
+        add(cell, first, cell.levels.size());
     }
     if (isGraded) { // in front, where it is never cut off
         row.pieces.insert(row.pieces.begin(), "profile " + _status.profile);

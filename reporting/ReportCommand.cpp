@@ -15,6 +15,7 @@
 #include "report/Page.h"
 #include "report/PageData.h"
 #include "report/ReportWalk.h"
+#include "report/StoredReport.h"
 #include "text/Format.h"
 
 #include <algorithm>
@@ -60,7 +61,7 @@ const char* refusalOf(std::size_t recordings, const ReportOptions& options) {
     if (recordings > ReportCommand::kMostRecordings) {
         return "report takes one recording, or two to compare (see pallax report --help)";
     }
-    if (options.labels.size() > recordings) {
+    if (options.labels.size() > (options.store.empty() ? recordings : 1)) {
         return "--label is for one recording each (see pallax report --help)";
     }
     return nullptr;
@@ -89,6 +90,7 @@ TimeSpan spanOf(const Timeline& timeline) {
 } // namespace
 
 std::optional<std::string> ReportCommand::make(ExitStatus& status) {
+    const bool isStored = !_options.store.empty();
     const std::vector<PartPaths> recordings = joinedParts(_options.recordings, Recording::open);
     if (const char* refusal = refusalOf(recordings.size(), _options)) {
         _environment.report(refusal);
@@ -103,8 +105,9 @@ std::optional<std::string> ReportCommand::make(ExitStatus& status) {
     std::string page = track->empty() ? "" : pageTrack(*track);
     std::string json;
     bool isOnTrack = track->empty();
-    for (std::size_t place = 0; place < recordings.size(); ++place) {
-        const auto part = makePart(recordings[place], place, status);
+    for (std::size_t place = 0; place < (isStored ? 1 : recordings.size()); ++place) {
+        const auto part =
+            isStored ? makeStoredPart(status) : makePart(recordings[place], place, status);
         if (!part) {
             return std::nullopt;
         }
@@ -117,6 +120,26 @@ std::optional<std::string> ReportCommand::make(ExitStatus& status) {
         return std::nullopt;
     }
     return _options.json ? json : pageHtml(page, PageUse::Report);
+}
+
+std::optional<ReportCommand::Part> ReportCommand::makeStoredPart(ExitStatus& status) {
+    const Clock& zone = _environment.zone;
+    StoredReportRequest request{_options.store, _options.device, _options.technology, _options.from,
+                                _options.to};
+    request.head.title = _options.title;
+    request.head.label = _options.labels.empty() ? "" : _options.labels.front();
+    request.head.version = _environment.decoder.bundle.version().value_or("");
+    auto made = storedReport(request, {_environment.names, _environment.profile,
+                                       _environment.decoder.resources,
+                                       [&zone](Time time) { return zone.zone(time).offset; }});
+    if (!made) {
+        _environment.report(made.error());
+        status = kExitFailure;
+        return std::nullopt;
+    }
+    StoredReport report = std::move(made).value();
+    return Part{std::move(report.page), _options.json ? std::move(report.json) : "",
+                std::move(report.ticks)};
 }
 
 std::optional<Track> ReportCommand::readTrack(ExitStatus& status) const {

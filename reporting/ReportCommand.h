@@ -26,7 +26,7 @@ class Timeline;
 struct RecordedTechnology;
 struct ReportHead;
 
-/// `pallax report`: a recording as a page, or two of them to compare.
+/// `pallax report`: a recording as a page, two of them to compare, or a device of a store.
 struct ReportOptions {
     std::vector<std::string> recordings = {};
     std::string output = {}; ///< the page; "-" is standard output
@@ -39,7 +39,9 @@ struct ReportOptions {
     std::string title = {};
     std::vector<std::string> labels = {}; ///< of the devices, in the order of the recordings
     bool withIdentities = false;
-    std::string track = {}; ///< a GPX file
+    std::string track = {};                 ///< a GPX file
+    std::string store = {};                 ///< the file of a store; empty: recordings
+    std::optional<std::string> device = {}; ///< of the store; nothing: the only one
 };
 
 class ReportCommand {
@@ -72,6 +74,7 @@ private:
     };
 
     std::optional<Part> makePart(const PartPaths& paths, std::size_t place, ExitStatus& status);
+    std::optional<Part> makeStoredPart(ExitStatus& status);
     void showProgress(std::string_view doing, std::uint64_t packets) const;
     /// False after a complaint about the options.
     bool gather(Timeline& timeline, const std::string& name, ReportBuilder& report,

@@ -20,7 +20,10 @@
 #include "text/Format.h"
 
 #include <cerrno>
+#include <csignal>
 #include <cstring>
+#include <filesystem>
+#include <optional>
 #include <unistd.h>
 
 namespace pallax {
@@ -31,6 +34,25 @@ bool isStandardOutput(const ReportOptions& options) {
     return options.output == "-" || (options.output.empty() && options.json);
 }
 
+/// Signals that end the program wait while it exists.
+class DelayedSignals {
+public:
+    DelayedSignals() {
+        sigset_t ending{};
+        sigemptyset(&ending);
+        for (const int signal : {SIGINT, SIGTERM, SIGHUP}) {
+            sigaddset(&ending, signal);
+        }
+        (void)::sigprocmask(SIG_BLOCK, &ending, &_before);
+    }
+    ~DelayedSignals() { (void)::sigprocmask(SIG_SETMASK, &_before, nullptr); }
+    DelayedSignals(const DelayedSignals&) = delete;
+    DelayedSignals& operator=(const DelayedSignals&) = delete;
+
+private:
+    sigset_t _before{};
+};
+
 /// Whole, or not at all.
 ExitStatus write(const ReportOptions& options, const std::string& content) {
     if (isStandardOutput(options)) {
@@ -38,6 +60,11 @@ ExitStatus write(const ReportOptions& options, const std::string& content) {
         output.text() += content;
         output.flush();
         return kExitSuccess;
+    }
+    std::optional<DelayedSignals> delayed;
+    std::error_code ignored;
+    if (!std::filesystem::is_other(options.output, ignored)) {
+        delayed.emplace(); // they would leave what is written under another name
     }
     const auto file = NewFile::create(options.output);
     const Bytes bytes{reinterpret_cast<const std::uint8_t*>(content.data()), content.size()};
@@ -53,6 +80,10 @@ std::optional<std::string> refusalOf(const ReportOptions& options) {
         return outputIntoRecording(options.recordings);
     }
     std::error_code ignored;
+    if (!options.store.empty() &&
+        std::filesystem::equivalent(options.store, options.output, ignored)) {
+        return formatText("%@ would be replaced by its report.", {options.output});
+    }
     if (recordingAmong(options.recordings, regularFile(options.output))) {
         return formatText("%@ would be replaced by its report.", {options.output});
     }
@@ -110,11 +141,9 @@ ExitStatus runReport(const ReportOptions& options) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
-    const auto profile = loadProfile(options.profile, profileFolder());
+    const auto profile = profileOrComplaint({options.profile, true, "report"});
     if (!profile) {
-        complain(profile.error().sentence +
-                 (profile.error().isUnknown ? " (see pallax report --help)" : ""));
-        return profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+        return profile.error();
     }
     return make(options, *settings, *profile);
 }

@@ -228,8 +228,10 @@ std::unique_ptr<StoreConnection> StoreConnection::openToRead(const std::string& 
         throw StoreFailure(formatText("There is no store %@ (see pallax store load).", {file}));
     }
     return whenFree([&] {
-        std::unique_ptr<StoreConnection> store(new StoreConnection(file, Mode::Read));
-        store->check(Empty::Refused);
+        StoreConnection(file, Mode::Read).check(Empty::Refused); // it may be of another program
+        // Only one that may write cleans up after itself, and after a writer that was killed.
+        std::unique_ptr<StoreConnection> store(new StoreConnection(file, Mode::Write));
+        store->run("PRAGMA query_only = true");
         return store;
     });
 }

@@ -63,7 +63,7 @@ public:
     /// Creates the file, which only its user may read, if it is missing. Refuses, before anything
     /// is written, what is no store or one of a later version.
     static std::unique_ptr<StoreConnection> open(const std::string& file);
-    /// Opens an existing store; what it says must not change it.
+    /// Opens an existing store, which cannot be changed by it.
     static std::unique_ptr<StoreConnection> openToRead(const std::string& file);
     /// Why an existing file cannot be asked as a store; nothing if it can.
     static std::optional<std::string> refusal(const std::string& file);

@@ -4,7 +4,6 @@
 #include "decoding/RequiredTemplates.h"
 #include "host/Complaint.h"
 #include "host/DirectoryResources.h"
-#include "host/KnowledgeFiles.h"
 #include "host/MonotonicClock.h"
 #include "host/WallClock.h"
 #include "platform/RecordedTechnology.h"
@@ -277,11 +276,9 @@ ExitStatus askAddress(const StoreAskOptions& options, const QualityProfile& prof
 } // namespace
 
 ExitStatus runStoreAsk(const StoreAskOptions& options) {
-    const auto profile = loadProfile(options.profile, profileFolder());
+    const auto profile = profileOrComplaint({options.profile, true, "store"});
     if (!profile) {
-        complain(profile.error().sentence +
-                 (profile.error().isUnknown ? " (see pallax store --help)" : ""));
-        return profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
+        return profile.error();
     }
     return isStoreAddress(options.store) ? askAddress(options, *profile)
                                          : askFile(options, *profile);

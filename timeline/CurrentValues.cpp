@@ -51,6 +51,31 @@ void CurrentValues::take(const CurrentValues& other) {
     _listener = listener;
 }
 
+void CurrentValues::beginReplacing(Time time) {
+    _time = time;
+    std::fill(_values.begin(), _values.end(), FieldValue());
+    for (List& list : _lists) {
+        list.count = 0;
+    }
+}
+
+void CurrentValues::replace(FieldIndex field, FieldValue value) {
+    if (field >= _values.size()) {
+        _values.resize(_fields->size());
+    }
+    _values[field] = std::move(value);
+}
+
+void CurrentValues::replace(ListId id, EntryValues entry) {
+    List& list = _lists[placeOf(id, kNone)];
+    if (list.count == list.slots.size()) {
+        list.slots.emplace_back();
+    }
+    Slot& slot = list.slots[list.count++];
+    slot.known = entry.entry;
+    slot.held = std::move(entry);
+}
+
 const FieldValue* CurrentValues::value(std::string_view fieldName) const {
     const auto field = _fields->named(fieldName);
     return field ? value(*field) : nullptr;

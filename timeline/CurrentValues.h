@@ -65,6 +65,12 @@ public:
     /// Takes the values of another one, but keeps its listener.
     void take(const CurrentValues& other);
 
+    // From elsewhere than records, without a listener: `beginReplacing` forgets all values.
+    void beginReplacing(Time time);
+    void replace(FieldIndex field, FieldValue value);
+    /// Adds an entry to a list, which is in no other.
+    void replace(ListId list, EntryValues entry);
+
     /// Nothing for a field in a list, and for one without a value.
     const FieldValue* value(FieldIndex field) const {
         return field < _values.size() && !_values[field].isEmpty() ? &_values[field] : nullptr;

@@ -1,19 +1,28 @@
 #include "web/WebCommand.h"
 
 #include "console/Output.h"
+#include "decoding/InstalledKnowledge.h"
+#include "decoding/RequiredTemplates.h"
+#include "host/AsioMainQueue.h"
+#include "host/BuildBundle.h"
 #include "host/Complaint.h"
+#include "host/DirectoryResources.h"
 #include "host/Files.h"
 #include "host/Interruption.h"
 #include "host/KnowledgeFiles.h"
 #include "host/RecordingParts.h"
 #include "host/UserFolders.h"
+#include "host/WallClock.h"
 #include "link/SourceChild.h"
+#include "report/StoredReport.h"
 #include "telephony/ChildService.h"
 #include "text/Format.h"
 #include "web/Browser.h"
+#include "web/StoredPage.h"
 #include "web/WebOptions.h"
 #include "web/WebSession.h"
 
+#include <csignal>
 #include <unistd.h>
 #include <utility>
 
@@ -54,19 +63,6 @@ std::optional<std::string> readPem(const std::string& path) {
     return std::string(content->begin(), content->end());
 }
 
-/// Nothing after a complaint.
-std::optional<QualityProfile> profileOf(const WebOptions& options, const Settings& settings,
-                                        ExitStatus& status) {
-    const std::string usual = settings.profile.value_or(std::string(kDefaultProfile));
-    auto profile = loadProfile(options.profile.value_or(usual), profileFolder());
-    if (!profile) {
-        complain(profile.error().sentence);
-        status = options.profile && profile.error().isUnknown ? kExitWrongUsage : kExitFailure;
-        return std::nullopt;
-    }
-    return std::move(profile).value();
-}
-
 RequestGate gateOf(const WebOptions& options, const Listener& listener) {
     return RequestGate({.address = listener.address,
                         .port = listener.port,
@@ -89,25 +85,88 @@ void present(const WebOptions& options, const RequestGate& gate) {
     }
 }
 
-ExitStatus serve(const WebOptions& options, const Settings& settings,
-                 const QualityProfile& profile) {
+/// Where clients come in.
+struct Entrance {
+    Listener listener;
+    std::optional<HttpServer::Identity> identity;
+};
+
+/// Nothing after a complaint.
+std::optional<Entrance> openEntrance(const WebOptions& options) {
     std::optional<HttpServer::Identity> identity;
     if (!options.certificate.empty()) {
         const auto certificate = readPem(options.certificate);
         const auto key = certificate ? readPem(options.key) : std::nullopt;
         if (!key) {
-            return kExitFailure;
+            return std::nullopt;
         }
         identity = HttpServer::Identity{*certificate, *key};
     }
     auto listener = Listener::at(options.address, options.port);
     if (!listener) {
         complain(listener.error().sentence);
-        return kExitFailure;
+        return std::nullopt;
     }
     if (!listener->isLoopback && !identity) {
         complain("Others on the network can read along: the connection is not encrypted (see "
                  "--certificate and --key).");
+    }
+    return Entrance{std::move(listener).value(), std::move(identity)};
+}
+
+NetworkNames readNames() {
+    InstalledNames installed = readInstalledNames(dataFolders());
+    for (const std::string& complaint : installed.complaints) {
+        complain(complaint);
+    }
+    return std::move(installed.names);
+}
+
+ExitStatus serveStored(const WebOptions& options, const QualityProfile& profile) {
+    const RequiredTemplates resources(DirectoryResources::programFolder());
+    const NetworkNames names = readNames();
+    StoredReportRequest request{options.store, options.device, options.technology, options.from,
+                                options.to};
+    request.head.version = BuildBundle().version().value_or("");
+    const auto report = storedReport(request, {names, profile, resources, [](Time time) {
+                                                   return WallClock().zone(time).offset;
+                                               }});
+    if (!report) {
+        complain(report.error());
+        return kExitFailure;
+    }
+    const StoredPage page(report->page);
+    auto entrance = openEntrance(options);
+    if (!entrance) {
+        return kExitFailure;
+    }
+    RequestGate gate = gateOf(options, entrance->listener);
+    AsioMainQueue queue;
+    queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [&queue](int /*signal*/) { queue.stop(); });
+    const auto server =
+        HttpServer::start({.queue = queue,
+                           .listener = std::move(entrance->listener),
+                           .identity = std::move(entrance->identity),
+                           .answer = [&](const WebRequest& asked) {
+                               RequestGate::Verdict verdict = gate.decide(asked);
+                               return verdict.decision == RequestGate::Decision::Serve
+                                          ? page.answer(asked)
+                                          : std::move(verdict.response);
+                           }});
+    if (!server) {
+        complain(server.error().sentence);
+        return kExitFailure;
+    }
+    present(options, gate);
+    queue.run();
+    return kExitSuccess;
+}
+
+ExitStatus serve(const WebOptions& options, const Settings& settings,
+                 const QualityProfile& profile) {
+    auto entrance = openEntrance(options);
+    if (!entrance) {
+        return kExitFailure;
     }
     std::unique_ptr<ChildService> child;
     if (!std::holds_alternative<ServiceModem>(options.source)) {
@@ -118,19 +177,16 @@ ExitStatus serve(const WebOptions& options, const Settings& settings,
         }
         child = std::move(started).value();
     }
-    const InstalledNames installed = readInstalledNames(dataFolders());
-    for (const std::string& complaint : installed.complaints) {
-        complain(complaint);
-    }
-    const RequestGate gate = gateOf(options, *listener);
+    const NetworkNames names = readNames();
+    const RequestGate gate = gateOf(options, entrance->listener);
     WebSession session({.options = options,
                         .settings = settings,
-                        .names = installed.names,
+                        .names = names,
                         .profile = profile,
                         .child = child.get(),
                         .gate = gate,
-                        .listener = std::move(listener).value(),
-                        .identity = std::move(identity),
+                        .listener = std::move(entrance->listener),
+                        .identity = std::move(entrance->identity),
                         .ready = [&] { present(options, gate); }});
     const auto failure = session.run();
     const bool isContented = child == nullptr || endChild(*child);
@@ -143,7 +199,8 @@ ExitStatus serve(const WebOptions& options, const Settings& settings,
 } // namespace
 
 ExitStatus runWeb(const WebOptions& options) {
-    if (const auto refused = refuse(options.source)) {
+    const auto refused = options.store.empty() ? refuse(options.source) : std::nullopt;
+    if (refused) {
         return *refused;
     }
     const Interruption interruption;
@@ -152,9 +209,14 @@ ExitStatus runWeb(const WebOptions& options) {
         complain(settings.error().sentence);
         return kExitFailure;
     }
-    ExitStatus status = kExitSuccess;
-    const auto profile = profileOf(options, *settings, status);
-    return profile ? serve(options, *settings, *profile) : status;
+    const std::string usual = settings->profile.value_or(std::string(kDefaultProfile));
+    const auto profile =
+        profileOrComplaint({options.profile.value_or(usual), options.profile.has_value()});
+    if (!profile) {
+        return profile.error();
+    }
+    return options.store.empty() ? serve(options, *settings, *profile)
+                                 : serveStored(options, *profile);
 }
 
 } // namespace pallax

@@ -3,6 +3,7 @@
 #include "knowledge/Quality.h"
 #include "sources/Source.h"
 #include "telephony/PacketPlayer.h"
+#include "text/TimeText.h"
 
 #include <cstdint>
 #include <optional>
@@ -10,7 +11,9 @@
 
 namespace pallax {
 
-/// `pallax web`: a live page for browsers.
+struct RecordedTechnology;
+
+/// `pallax web`: a live page, or a page of stored measurements, for browsers.
 struct WebOptions {
     Source source = {};
     PlayOptions play = {};
@@ -22,6 +25,11 @@ struct WebOptions {
     bool open = false; ///< in the user's browser
     bool withIdentities = false;
     std::optional<std::string> profile = {}; ///< nothing: that of the settings
+    std::string store = {}; ///< the file of a store, which is shown instead; empty: the source
+    std::optional<std::string> device = {};         ///< of the store; nothing: the only one
+    const RecordedTechnology* technology = nullptr; ///< null: the only one of the device
+    std::optional<TimeText> from = {};              ///< of what the store has of the device
+    std::optional<TimeText> to = {};
 };
 
 } // namespace pallax

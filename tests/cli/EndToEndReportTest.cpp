@@ -36,6 +36,51 @@ TEST_F(EndToEndReport, WritesAPageThatItsUserAloneCanRead) {
     EXPECT_EQ(run({"report", sampleDrive(), "-o", "-"}).out, html) << "the same bytes";
 }
 
+TEST_F(EndToEndReport, IsDrawnFromAStore) {
+    const std::string store = world.path("s.db");
+    ASSERT_EQ(run({"store", "load", "--into", store, "--device", "car1", sampleDrive()}).status, 0);
+    const Run made = run({"report", "--store", store, "--device", "car1", "-o", page()});
+    EXPECT_EQ(made.status, 0) << made.err;
+    EXPECT_EQ(made.err, "");
+    EXPECT_TRUE(doubles::contentOf(page()).starts_with("<!doctype html>"));
+    EXPECT_FALSE(fs::exists(store + "-wal")) << "nothing is left beside the store";
+    const auto stored = nlohmann::json::parse(run({"report", "--json", "--store", store}).out);
+    const auto recorded = nlohmann::json::parse(run({"report", "--json", sampleDrive()}).out);
+    EXPECT_EQ(stored["cells"], recorded["cells"]);
+    EXPECT_EQ(stored["events"], recorded["events"]);
+    EXPECT_EQ(stored["head"]["recording"], "lte-drive.pcap");
+    ASSERT_EQ(stored["measures"].size(), recorded["measures"].size());
+    for (std::size_t place = 0; place < stored["measures"].size(); ++place) {
+        EXPECT_EQ(stored["measures"][place]["seconds"], recorded["measures"][place]["seconds"]);
+    }
+}
+
+TEST_F(EndToEndReport, WhatCannotBeDrawnFromAStoreIsASentence) {
+    const std::string store = world.path("s.db");
+    const auto refusal = [&](std::vector<std::string> arguments) {
+        arguments.insert(arguments.begin(), {"report", "-o", page(), "--store"});
+        const Run refused = run(arguments);
+        EXPECT_EQ(refused.status, 1);
+        EXPECT_EQ(refused.out, "");
+        EXPECT_FALSE(fs::exists(page()));
+        return refused.err;
+    };
+    EXPECT_EQ(refusal({store}),
+              "pallax: There is no store " + store + " (see pallax store load).\n");
+    EXPECT_EQ(refusal({sampleDrive()}), "pallax: " + sampleDrive() + " is no file of SQLite.\n");
+    ASSERT_EQ(run({"store", "load", "--into", store, "--device", "car1", sampleDrive()}).status, 0);
+    EXPECT_EQ(refusal({store, "--device", "car3"}),
+              "pallax: The store has no device \"car3\". Did you mean \"car1\"?\n");
+    EXPECT_EQ(refusal({store, "--from", "2030-01-01"}),
+              "pallax: The store has nothing of car1 in that time.\n");
+    EXPECT_EQ(refusal({"clickhouse://host/db"}),
+              "pallax: \"clickhouse://host/db\" is no file, and a report is drawn from the file of "
+              "a store.\n");
+    const Run itself = run({"report", "--store", store, "-o", store});
+    EXPECT_EQ(itself.status, 1);
+    EXPECT_EQ(itself.err, "pallax: " + store + " would be replaced by its report.\n");
+}
+
 TEST_F(EndToEndReport, PrintsTheFiguresOfEachRecordingOnALine) {
     const Run made = run({"report", "--json", sampleDrive(), gsmAttach()});
     EXPECT_EQ(made.status, 0);
@@ -177,7 +222,7 @@ TEST_F(EndToEndReport, WrongUsageIsOneSentence) {
     EXPECT_EQ(refused({"report", sampleDrive()}),
               "pallax: --output or --json is required (see pallax report --help)\n");
     EXPECT_EQ(refused({"report", "-o", page()}),
-              "pallax: RECORDING is required (see pallax report --help)\n");
+              "pallax: RECORDING or --store is required (see pallax report --help)\n");
     EXPECT_EQ(refused({"report", "--profile", "none", sampleDrive(), "-o", page()}),
               "pallax: profile \"none\" is not one of android|field|operator "
               "(see pallax report --help)\n");

@@ -34,6 +34,18 @@ TEST_F(EndToEndWebFaults, ARecordingThatIsNotThereOrIsNone) {
     fails({noise}, noise + " is not a recording: it is neither pcap nor pcapng.");
 }
 
+TEST_F(EndToEndWebFaults, AStoreThatIsNotThereOrHasNothing) {
+    const std::string store = world.path("s.db");
+    fails({"--store", store}, "There is no store " + store + " (see pallax store load).");
+    ASSERT_EQ(run({"store", "load", "--into", store, "--device", "car1",
+                   PALLAX_SOURCE_DIR "/samples/lte-drive.pcap"})
+                  .status,
+              0);
+    fails({"--store", store, "--device", "bus"}, "The store has no device \"bus\".");
+    fails({"--store", store, "--from", "2030-01-01"},
+          "The store has nothing of car1 in that time.");
+}
+
 TEST_F(EndToEndWebFaults, ARecordingThatIsCutIsShownAndItsEndIsAFailure) {
     const std::string whole = doubles::contentOf(gsmAttach());
     const std::string cut = file("cut.pcap", whole.substr(0, whole.size() - 5));

@@ -35,6 +35,23 @@ TEST_F(EndToEndWeb, TheStateAtTheEndIsThatOfDecode) {
     endsQuietly(web);
 }
 
+TEST_F(EndToEndWeb, ServesThePageOfAStore) {
+    const std::string store = world.path("s.db");
+    ASSERT_EQ(run({"store", "load", "--into", store, "--device", "car1",
+                   PALLAX_SOURCE_DIR "/samples/lte-drive.pcap"})
+                  .status,
+              0);
+    PallaxProcess web(world, {"web", "--store", store, "--device", "car1"});
+    enter(web);
+    const std::string page = get("/");
+    EXPECT_NE(page.find("<!doctype html>"), std::string::npos);
+    const std::string made = run({"report", "--store", store, "-o", "-"}).out;
+    EXPECT_TRUE(page.ends_with(made)) << "that of the report";
+    EXPECT_NE(get("/api/figures").find("404"), std::string::npos);
+    EXPECT_EQ(statusOf(getRequest("/", host)), "403") << "only with the link";
+    endsQuietly(web);
+}
+
 TEST_F(EndToEndWeb, MasksIdentitiesUnlessToldOtherwise) {
     using std::chrono::milliseconds;
     const std::string path =

@@ -281,6 +281,30 @@ TEST(Options, AReportIsOfAPartAndHasAProfile) {
     EXPECT_EQ(ended({"report", "a"}).status, kExitWrongUsage);
 }
 
+TEST(Options, AReportCanBeOfAStore) {
+    const auto told = parsed<ReportOptions>({"report", "--store", "s.db", "--device", "car1",
+                                             "--technology", "lte", "--from", "start", "-o", "a"});
+    EXPECT_EQ(told.store, "s.db");
+    EXPECT_EQ(told.device, "car1");
+    EXPECT_EQ(told.technology->commandName, "lte");
+    EXPECT_TRUE(told.from);
+    const auto refusal = [](std::vector<std::string> arguments) {
+        arguments.insert(arguments.begin(), {"report", "-o", "a.html"});
+        const ParseEnd end = ended(std::move(arguments));
+        EXPECT_EQ(end.status, kExitWrongUsage);
+        return end.text;
+    };
+    EXPECT_EQ(refusal({}), "pallax: RECORDING or --store is required (see pallax report --help)\n");
+    EXPECT_EQ(refusal({"--device", "car1", "a.pcap"}),
+              "pallax: --device requires --store (see pallax report --help)\n");
+    EXPECT_EQ(refusal({"--store", "s.db", "a.pcap"}),
+              "pallax: --store excludes RECORDING (see pallax report --help)\n");
+    EXPECT_EQ(refusal({"--store", "s.db", "--where", "x"}),
+              "pallax: --where excludes --store (see pallax report --help)\n");
+    EXPECT_EQ(refusal({"--store", "s.db", "--with-identities"}),
+              "pallax: --with-identities excludes --store (see pallax report --help)\n");
+}
+
 TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
     for (const char* command :
          {"",       "decode",  "record", "service",  "demo",       "simulate", "events",

@@ -20,6 +20,27 @@ TEST(WebArguments, WithoutAnyAreTheLiveModemOnThisMachineAlone) {
     EXPECT_FALSE(options.metrics || options.open || options.withIdentities);
 }
 
+TEST(WebArguments, CanNameAStoreInsteadOfASource) {
+    const auto options = parsed<WebOptions>({"web", "--store", "s.db", "--device", "car1", "--from",
+                                             "start", "--to", "end", "--technology", "lte"});
+    EXPECT_EQ(options.store, "s.db");
+    EXPECT_EQ(options.device, "car1");
+    EXPECT_EQ(options.technology->commandName, "lte");
+    EXPECT_TRUE(options.from && options.to && options.to->isEnd());
+    for (const char* option : {"--device", "--from", "--to"}) {
+        EXPECT_EQ(refused({option, "start"}),
+                  std::string("pallax: ") + option + " requires --store (see pallax web --help)\n");
+    }
+    EXPECT_EQ(refused({"--store", "s.db", "--metrics"}),
+              "pallax: --store excludes --metrics (see pallax web --help)\n");
+    EXPECT_EQ(refused({"--store", "s.db", "--with-identities"}),
+              "pallax: --store excludes --with-identities (see pallax web --help)\n");
+    EXPECT_EQ(refused({"--store", "s.db", "demo"}),
+              "pallax: demo: it is shown alone, without a store (see pallax web --help)\n");
+    EXPECT_EQ(refused({"--store", "s.db", "a.pcap"}),
+              "pallax: RECORDING excludes --store (see pallax web --help)\n");
+}
+
 TEST(WebArguments, SaySourceAndHowToListen) {
     const auto options = parsed<WebOptions>(
         {"web", "--connect", "car1", "--port", "8080", "--listen", "::", "--certificate", "c.pem",

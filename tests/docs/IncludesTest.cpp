@@ -111,7 +111,7 @@ const std::vector<Layer>& layers() {
           "host", "console", "decoding"}},
         {"report",
          {"text", "plist", "platform", "packets", "knowledge", records, generators, "app/tree",
-          "monitor", "fields", "timeline", "overview", "query", "host", "decoding"}},
+          "monitor", "fields", "timeline", "overview", "query", "host", "store", "decoding"}},
         {"reporting",
          {"text", "plist", "platform", "packets", "LogGenerator/Technologies", "knowledge", "host",
           "fields", "timeline", "overview", "query", "console", "decoding", "link", "live",

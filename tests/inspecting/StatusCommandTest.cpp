@@ -64,7 +64,7 @@ TEST_F(StatusCommandTest, OfEachTechnologyIsAtTheEndOfTheRecording) {
               "            881.52 MHz\n"
               "EV-DO cell  PN 118 · channel 466 · band 0 · 883.98 MHz\n"
               "levels      profile android · 1x AGC -65.92 dBm excellent\n"
-              "            1x Ec/Io -2.35 dB excellent · EV-DO AGC -59 dBm excellent\n"
+              "            EV-DO AGC -59 dBm excellent · 1x Ec/Io -2.35 dB excellent\n"
               "            EV-DO Ec/Io -3.98 dB\n"
               "state       1x Slotted mode sleep state [7] · EV-DO Connected [5]\n"
               "            EV-DO session Open [4]\n");

@@ -82,6 +82,29 @@ TEST(StatusText, FitsTenLinesOfEightyColumnsAndKeepsTheProfile) {
     EXPECT_NE(text.find("…\n"), std::string::npos) << text;
 }
 
+TEST(StatusText, OfSeveralCellsTheStrengthsComeFirst) {
+    Status status = emptyStatus();
+    for (const char* system : {"LTE", "NR"}) {
+        status.cells.push_back({system,
+                                "",
+                                {value("PCI", "1")},
+                                {},
+                                "",
+                                {},
+                                {value("RSRP", "-90 dBm"), value("RSRQ", "-9 dB")}});
+    }
+    EXPECT_EQ(textOf(status), "LTE · 2023-11-14 22:13:20 · a.pcap\n"
+                              "LTE cell    PCI 1\n"
+                              "NR cell     PCI 1\n"
+                              "levels      profile field · LTE RSRP -90 dBm good · NR RSRP -90 dBm "
+                              "good\n"
+                              "            LTE RSRQ -9 dB good · NR RSRQ -9 dB good\n");
+    status.cells.pop_back();
+    EXPECT_EQ(textOf(status), "LTE · 2023-11-14 22:13:20 · a.pcap\n"
+                              "cell        PCI 1\n"
+                              "levels      profile field · RSRP -90 dBm good · RSRQ -9 dB good\n");
+}
+
 TEST(StatusText, TellsHowManyCellsItLeavesOut) {
     Status status = emptyStatus();
     status.network = StatusOperator{NetworkCode{"262", "42"}, "Net", "", NameSource::Sim, false};

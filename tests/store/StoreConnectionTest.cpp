@@ -139,5 +139,19 @@ TEST_F(StoreConnectionTest, AFullDiskIsASentence) {
     EXPECT_FALSE(store->prepare("SELECT 1 FROM texts").step());
 }
 
+TEST(StoreConnectionToRead, ChangesNothingAndLeavesNothingBeside) {
+    const doubles::TemporaryFolder folder;
+    const std::string file = folder.path("s.db");
+    { const auto made = StoreConnection::open(file); }
+    {
+        const auto store = StoreConnection::openToRead(file);
+        EXPECT_FALSE(store->prepare("SELECT id FROM recordings").step());
+        EXPECT_THROW(store->run("DELETE FROM recordings"), StoreFailure);
+    }
+    EXPECT_FALSE(std::filesystem::exists(file + "-wal"));
+    EXPECT_THROW((void)StoreConnection::openToRead(folder.path("missing.db")), StoreFailure);
+    EXPECT_FALSE(std::filesystem::exists(folder.path("missing.db")));
+}
+
 } // namespace
 } // namespace pallax

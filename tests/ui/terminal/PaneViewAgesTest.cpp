@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <map>
-
 namespace pallax::terminal {
 namespace {
 
@@ -13,23 +11,16 @@ using namespace std::chrono_literals;
 class PaneViewAgesTest : public StageFixture {
 protected:
     PaneViewAgesTest() {
-        stage.ages = [this](const std::string& path) -> std::optional<ReadingAge> {
-            const auto found = overdue.find(path);
-            return found != overdue.end() ? std::optional(ReadingAge{found->second, true})
-                                          : std::nullopt;
-        };
-        stage.pane().setAges(stage.ages);
+        stage.showAges();
         stage.tick(display());
     }
-
-    std::map<std::string, std::chrono::seconds> overdue;
 };
 
 TEST_F(PaneViewAgesTest, AnOverdueValueIsDimAndTellsItsAge) {
-    overdue = {{"/Serving Cell Measurements", 14s},
-               {"/Serving Cell Measurements/E-ARFCN", 200s},
-               {"/Serving Cell Measurements/Measured RSRP", 14s},
-               {"/Measured Neighbor Cells", 7200s}};
+    stage.overdue = {{"/Serving Cell Measurements", 14s},
+                     {"/Serving Cell Measurements/E-ARFCN", 200s},
+                     {"/Serving Cell Measurements/Measured RSRP", 14s},
+                     {"/Measured Neighbor Cells", 7200s}};
     EXPECT_EQ(stage.screen(80, 9), R"(
  Pallax
  ──────────────────────────────────────────────────────────────────────────────
@@ -64,9 +55,9 @@ TEST_F(PaneViewAgesTest, AnOverdueValueIsDimAndTellsItsAge) {
 }
 
 TEST_F(PaneViewAgesTest, WithoutRoomForTheAgeAMarkTellsIt) {
-    overdue = {{"/Serving Cell Measurements", 14s},
-               {"/Measured Neighbor Cells", 14s},
-               {"/Serving Cell Measurements/Measured RSRP", 14s}};
+    stage.overdue = {{"/Serving Cell Measurements", 14s},
+                     {"/Measured Neighbor Cells", 14s},
+                     {"/Serving Cell Measurements/Measured RSRP", 14s}};
     EXPECT_EQ(stage.screen(30, 6), R"(
  Pallax
  ────────────────────────────
@@ -94,7 +85,7 @@ TEST_F(PaneViewAgesTest, AnEmptyPaneSaysWhy) {
  Updated 2023-11-14 at 22:13:20  ? help
 )");
     EXPECT_EQ(styleAt(1, 2), Style{.dim = true});
-    overdue = {{"/Empty List", 14s}};
+    stage.overdue = {{"/Empty List", 14s}};
     EXPECT_EQ(stage.line(2), " Reported empty 14 s ago.");
 }
 

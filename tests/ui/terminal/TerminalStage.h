@@ -10,6 +10,8 @@
 #include "text/Utf8.h"
 #include "ui/terminal/FrontEnd.h"
 
+#include <chrono>
+#include <map>
 #include <memory>
 #include <optional>
 #include <string>
@@ -78,7 +80,18 @@ public:
     doubles::ManualClock clock;
     doubles::SteppedQueue queue;
     PropertyList saveHistory;
-    ReadingAges ages; ///< of the panes that are opened later
+    ReadingAges ages;                                    ///< of the panes that are opened later
+    std::map<std::string, std::chrono::seconds> overdue; ///< by path, once `showAges` was called
+
+    /// Lets panes say for how long the values of `overdue` have not come.
+    void showAges() {
+        ages = [this](const std::string& path) -> std::optional<ReadingAge> {
+            const auto found = overdue.find(path);
+            return found != overdue.end() ? std::optional(ReadingAge{found->second, true})
+                                          : std::nullopt;
+        };
+        pane().setAges(ages);
+    }
 
     /// Shows new data: reloads every pane, or pops to below the first whose path has vanished. A
     /// null display means no connection.

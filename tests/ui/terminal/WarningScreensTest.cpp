@@ -16,15 +16,9 @@ protected:
     static std::string screenOf(int columns, int rows, const Marks& marks = kUtf8Marks) {
         TerminalStage stage(marks);
         stage.frontEnd.setOrigin({"Zorell_LTE", "drive.pcap"});
-        stage.ages = [](const std::string& path) -> std::optional<ReadingAge> {
-            if (path == "/Serving Cell Measurements/Measured RSRP") {
-                return ReadingAge{14s, true};
-            }
-            return path == "/Serving Cell Measurements/E-ARFCN"
-                       ? std::optional(ReadingAge{200s, true})
-                       : std::nullopt;
-        };
-        stage.pane().setAges(stage.ages);
+        stage.overdue = {{"/Serving Cell Measurements/Measured RSRP", 14s},
+                         {"/Serving Cell Measurements/E-ARFCN", 200s}};
+        stage.showAges();
         stage.tick(display());
         stage.press(Key::Enter);
         stage.frontEnd.setAlarms({"weak signal", "no service"});

@@ -1,0 +1,61 @@
+#pragma once
+
+#include "store/StoreConnection.h"
+#include "timeline/CurrentValues.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+#include <map>
+#include <utility>
+#include <vector>
+
+namespace pallax {
+
+/// What a recording in a store shows at display ticks, as far as a report looks at it: cells with
+/// their levels, neighbours, the network, states and contexts.
+class StoredTicks {
+public:
+    /// All must outlive it. The fields are those of the recordings' technology.
+    StoredTicks(StoreConnection& store, FieldTable& fields, EntryTable& entries);
+
+    struct Recording {
+        std::int64_t id = 0;
+        Time first;
+        bool isOfPackets = false; ///< it has the values of each packet, not those of the ticks
+    };
+    /// Calls `take` at each tick at which something is known, with the values that are known then
+    /// and the first packet of the stretch of time.
+    using Take = std::function<void(Time time, const CurrentValues& values, std::uint64_t packet)>;
+    void walk(const Recording& recording, const Take& take);
+
+private:
+    struct Held {
+        FieldIndex field;
+        ListId list; ///< 0: none
+        EntryId entry;
+        Time start;
+        Time end;
+        std::uint64_t packet;
+        FieldValue value;
+    };
+    using Range = std::pair<std::vector<Held>::iterator, std::vector<Held>::iterator>;
+
+    void read(const Recording& recording);
+    Held readRow(FieldIndex field, Time first);
+    ListId listOf(FieldIndex field);
+    void walkStretch(const Range& stretch, Time tick, const Take& take);
+    void show(Time tick);
+    Time readAt(const Held& held, Time tick) const;
+
+    FieldTable& _fields;
+    EntryTable& _entries;
+    CurrentValues _values;
+    Statement _intervals;
+    std::vector<FieldIndex> _wanted;
+    bool _isOfPackets = false; ///< the recording
+    std::vector<Held> _held;   ///< of the recording, in the order of packets
+    std::map<std::pair<EntryId, FieldIndex>, const Held*> _current;
+};
+
+} // namespace pallax
