@@ -119,7 +119,7 @@ std::string ServerStore::table(const std::string& name) const {
 }
 
 std::string ServerStore::currentLoads() const {
-    return formatText("load IN (SELECT load FROM %@.recordings_local)",
+    return formatText("load IN (SELECT load FROM %@.current_local)",
                       {_server.address().database});
 }
 
