@@ -89,7 +89,7 @@ std::string secondsText(std::chrono::milliseconds time) {
 
 struct HttpExchange::Impl {
     struct Free {
-        void operator()(CURL* handle) const { curl_easy_cleanup(handle); }
+        void operator()(CURL* easy) const { curl_easy_cleanup(easy); }
         void operator()(curl_slist* list) const { curl_slist_free_all(list); }
     };
 

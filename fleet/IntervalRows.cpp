@@ -14,7 +14,7 @@ namespace pallax {
 namespace {
 
 constexpr std::int64_t kMinute = 60'000; ///< milliseconds
-constexpr std::int64_t kMinutesOfDay = 24 * 60;
+constexpr std::int64_t kMinutesOfDay = std::int64_t{24} * 60;
 constexpr double kStepsOfReal = 16; ///< levels come in halves, quarters or sixteenths of a decibel
 constexpr std::array<std::int64_t, 5> kScales{1, 10, 100, 1000, 10000};
 

@@ -119,8 +119,7 @@ std::string ServerStore::table(const std::string& name) const {
 }
 
 std::string ServerStore::currentLoads() const {
-    return formatText("load IN (SELECT load FROM %@.recordings_local)",
-                      {_server.address().database});
+    return formatText("load IN (SELECT load FROM %@.current_local)", {_server.address().database});
 }
 
 std::vector<LoadedRecording> ServerStore::loads(const std::string& condition,
@@ -269,34 +268,35 @@ void ServerStore::addFields(const RecordingMeasurements& measurements) {
            rows);
 }
 
-/// Copies get the rows of a table in any order, and those of two tables independently. So all must
-/// have all rows before the load's own row is written. Servers of other shards may be missing:
-/// without them nothing of this load is missed, and without one of its own shard the count is
-/// short.
-void ServerStore::waitForCopies() {
-    if (_copies < 2) {
-        return;
-    }
-    constexpr std::chrono::milliseconds kPause{50};
+/// The rows of this load that copies have. Servers of other shards may be missing: without them
+/// nothing of it is missed, and without one of its own shard the sum is short.
+std::int64_t ServerStore::rowsOfCopies() {
     const std::string own =
-        formatText("month = %u AND device = %@ AND load = %@",
+        formatText("month = %u AND device = %@ AND load = %@ SETTINGS skip_unavailable_shards = 1",
                    {monthOf(_recording.first), clickHouseText(_recording.device),
                     std::to_string(_recording.id)});
     std::string fields = "''";
     for (const std::string& field : _fields) {
         fields += ", " + clickHouseText(field);
     }
-    constexpr const char* kWithoutOthers = " SETTINGS skip_unavailable_shards = 1";
+    std::int64_t rows = 0;
+    for (const std::string& of :
+         {formatText("intervals_everywhere WHERE field IN (%@)", {fields}),
+          std::string("events_everywhere WHERE 1"), std::string("cells_everywhere WHERE 1")}) {
+        rows += integerOf(
+            _server.rows(formatText("SELECT count() FROM %@ AND %@", {of, own}), 1).at(0)[0]);
+    }
+    return rows;
+}
+
+/// Copies get the rows of a table in any order, and those of two tables independently. So all must
+/// have all rows before the load's own row is written.
+void ServerStore::waitForCopies() {
+    constexpr std::chrono::milliseconds kPause{50};
     auto latest = std::chrono::steady_clock::now();
     std::int64_t most = 0;
-    while (true) {
-        std::int64_t there = 0;
-        for (const std::string& query :
-             {"intervals_everywhere WHERE field IN (" + fields + ") AND " + own,
-              "events_everywhere WHERE " + own, "cells_everywhere WHERE " + own}) {
-            there += integerOf(
-                _server.rows("SELECT count() FROM " + query + kWithoutOthers, 1).at(0)[0]);
-        }
+    while (_copies > 1) {
+        const std::int64_t there = rowsOfCopies();
         if (there == _rows * _copies) {
             return;
         }

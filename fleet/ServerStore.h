@@ -43,6 +43,7 @@ private:
     void insert(const std::string& name, std::string_view columns, const RowBinary& rows);
     void addCells(const RecordingMeasurements& measurements);
     void addFields(const RecordingMeasurements& measurements);
+    std::int64_t rowsOfCopies();
     void waitForCopies();
     void writeLoads(const std::vector<LoadedRecording>& gone, bool withThis);
     void settle();

@@ -148,8 +148,16 @@ FROM intervals_local
 WHERE known = 1 AND hold_minutes + hold_seconds + hold_ms > 0 AND entry = '' AND unit IN ('dBm', 'dB')
 GROUP BY field, device, load, month, system, cell, piece;
 
--- The recordings of this shard: the latest load of each. One scan of one table, so a query sees a
--- recording before it is replaced or after, and never both or neither.
+-- The loads of this shard that count: the latest of each recording. One scan of one table, so a query
+-- sees a recording before it is replaced or after, and never both or neither. Each query on
+-- measurements begins with it, so it reads as little as possible.
+CREATE VIEW IF NOT EXISTS current_local AS
+SELECT latest AS load
+FROM (SELECT max(load) AS latest, argMax(gone, load) AS is_gone FROM loads_local
+    GROUP BY sipHash128(digest)) -- in half the time and memory of the text
+WHERE is_gone = 0;
+
+-- The recordings of this shard.
 CREATE VIEW IF NOT EXISTS recordings_local AS
 SELECT load, device, name, digest, beginnings, technology, decoder, every, identities, packets,
     first, last, nullIf(trouble, '') AS trouble
@@ -171,7 +179,7 @@ SELECT (toInt64(day) * 1440 + minute) * 60000 + toInt64(second) * 1000 + ms AS s
     toInt64(packet_high) * 65536 + toInt64(packet_middle) * 256 + packet_low AS packet,
     device, recording, technology, decoder
 FROM intervals_local
-WHERE load IN (SELECT load FROM recordings_local);
+WHERE load IN (SELECT load FROM current_local);
 
 -- A row for each interval; start and hold are microseconds, as in pallax sql.
 CREATE VIEW IF NOT EXISTS measurement_local AS
@@ -189,12 +197,12 @@ WHERE part < 2;
 
 CREATE VIEW IF NOT EXISTS event_local AS
 SELECT time, packet, kind, words, fields, device, recording
-FROM events_local WHERE load IN (SELECT load FROM recordings_local);
+FROM events_local WHERE load IN (SELECT load FROM current_local);
 
 CREATE VIEW IF NOT EXISTS cell_local AS
 SELECT role, system, identity, code, channel, first_time, last_time, packet, readings, measure,
     best_level, last_level, device, recording
-FROM cells_local WHERE load IN (SELECT load FROM recordings_local);
+FROM cells_local WHERE load IN (SELECT load FROM current_local);
 
 CREATE VIEW IF NOT EXISTS field_local AS
 SELECT name, path, kind, unit, least, most, in_list, identifies, personal, meaning, shown
@@ -208,7 +216,7 @@ SELECT field, device, nullIf(system, '') AS system, nullIf(cell, '') AS cell,
 FROM (
     SELECT field, device, load, system, cell, at_minute, sumMerge(held) AS hold_sum,
         sumMerge(weighted) AS weighted_sum, minMerge(lowest) AS least, maxMerge(highest) AS greatest
-    FROM minutes_local WHERE load IN (SELECT load FROM recordings_local)
+    FROM minutes_local WHERE load IN (SELECT load FROM current_local)
     GROUP BY field, device, load, system, cell, at_minute
 );
 
@@ -219,7 +227,7 @@ SELECT field, device, nullIf(system, '') AS system, nullIf(cell, '') AS cell,
 FROM (
     SELECT field, device, load, system, cell, at_hour, sumMerge(held) AS hold_sum,
         sumMerge(weighted) AS weighted_sum, minMerge(lowest) AS least, maxMerge(highest) AS greatest
-    FROM hours_local WHERE load IN (SELECT load FROM recordings_local)
+    FROM hours_local WHERE load IN (SELECT load FROM current_local)
     GROUP BY field, device, load, system, cell, at_hour
 );
 

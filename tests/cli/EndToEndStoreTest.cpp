@@ -336,6 +336,11 @@ TEST_F(EndToEndStore, WhatIsNoStoreIsToldInASentence) {
     EXPECT_EQ(address.status, 1);
     EXPECT_EQ(address.err, "pallax: \"http://host/db\" is no store: it is neither a file nor "
                            "clickhouse://HOST/DATABASE.\n");
+    const Run setup = run({"store", "setup", "--into", world.path("s.db")});
+    EXPECT_EQ(setup.status, 2);
+    EXPECT_EQ(setup.err,
+              "pallax: setup needs --into clickhouse://HOST/DATABASE; a file is made when "
+              "it is loaded into.\n");
     const Run folder = run({"store", "load", "--into", world.path("no/such/s.db"), drive});
     EXPECT_EQ(folder.status, 1);
     EXPECT_EQ(folder.err, "pallax: " + world.path("no/such/s.db") +

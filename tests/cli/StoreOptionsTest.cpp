@@ -106,6 +106,19 @@ TEST(StoreOptions, WatchTakesAFolder) {
               "pallax: watch takes one folder (see pallax store --help)\n");
 }
 
+TEST(StoreOptions, SetupTakesAnAddressAndClusters) {
+    const auto one = parsed<StoreSetupOptions>({"store", "setup", "--into", "clickhouse://a/b"});
+    EXPECT_EQ(one.store, "clickhouse://a/b");
+    EXPECT_EQ(one.layout.cluster, "");
+    EXPECT_EQ(one.layout.servers, "");
+    const auto several = parsed<StoreSetupOptions>(
+        {"store", "setup", "--into", "clickhouse://a/b", "fleet", "servers"});
+    EXPECT_EQ(several.layout.cluster, "fleet");
+    EXPECT_EQ(several.layout.servers, "servers");
+    EXPECT_EQ(refusal({"store", "setup", "a", "b", "c"}),
+              "pallax: setup takes one or two clusters (see pallax store --help)\n");
+}
+
 TEST(StoreOptions, WrongOnesAreToldInASentence) {
     EXPECT_EQ(refusal({"store", "load"}),
               "pallax: load takes recordings (see pallax store --help)\n");
