@@ -30,6 +30,8 @@ public:
     using std::runtime_error::runtime_error;
 };
 
+constexpr std::int64_t kMicroseconds = 1000; // in a millisecond
+
 constexpr const char* kWithoutDisplay =
     "A store does not hold the display: its state at each tick is left out. Levels, cells, "
     "neighbours and states are drawn from the values that it holds.";
@@ -42,9 +44,15 @@ struct StoredDrive {
     std::string name;
     std::string technology;
     std::uint64_t packets = 0;
-    Time last;
     std::string trouble;
 };
+
+/// Of milliseconds since 1970, of which a file may have any.
+Time timeOf(std::int64_t time) {
+    const std::int64_t most =
+        std::chrono::floor<milliseconds>(kLatestTime.time_since_epoch()).count();
+    return Time(milliseconds(std::clamp<std::int64_t>(time, 0, most)));
+}
 
 std::string listed(const std::vector<std::string>& names) {
     constexpr std::size_t kMost = 10;
@@ -88,12 +96,11 @@ std::vector<StoredDrive> drivesOf(StoreConnection& store, const std::string& dev
     enum DriveColumn : int { kId, kName, kTechnology, kEvery, kPackets, kFirst, kLast, kTrouble };
     find.bind(1, device);
     while (find.step()) {
-        drives.push_back({{find.integer(kId), Time(milliseconds(find.integer(kFirst))),
-                           find.text(kEvery) == "packet"},
+        drives.push_back({{find.integer(kId), timeOf(find.integer(kFirst)),
+                           timeOf(find.integer(kLast)), find.text(kEvery) == "packet"},
                           find.text(kName),
                           find.text(kTechnology),
                           static_cast<std::uint64_t>(find.integer(kPackets)),
-                          Time(milliseconds(find.integer(kLast))),
                           find.text(kTrouble)});
     }
     return drives;
@@ -103,9 +110,9 @@ std::vector<StoredDrive> drivesOf(StoreConnection& store, const std::string& dev
 DecodeWindow windowOf(const StoredReportRequest& request, const std::vector<StoredDrive>& drives,
                       const ZoneRule& zone) {
     DecodeWindow window({request.from, request.to});
-    TimeSpan span{drives.front().recording.first, drives.front().last};
+    TimeSpan span{drives.front().recording.first, drives.front().recording.last};
     for (const StoredDrive& drive : drives) {
-        span.end = std::max(*span.end, drive.last);
+        span.end = std::max(*span.end, drive.recording.last);
     }
     if (const auto refusal = window.open(span, zone)) {
         throw NoReport(*refusal);
@@ -135,6 +142,20 @@ const RecordedTechnology& technologyOf(std::vector<StoredDrive>& drives,
         throw NoReport(formatText("The store has nothing of %@ in that time.", {device}));
     }
     return *technology;
+}
+
+/// The page has every tick.
+void refuseTooMuch(const std::vector<StoredDrive>& drives) {
+    constexpr std::chrono::days kMost{100};
+    std::chrono::nanoseconds all{0};
+    for (const StoredDrive& drive : drives) {
+        const auto length = drive.recording.last - drive.recording.first;
+        if (length < std::chrono::nanoseconds(0) || length > kMost - all) {
+            throw NoReport("The recordings of that time last more than 100 days, which is too much "
+                           "for a page; choose less with --from and --to.");
+        }
+        all += length;
+    }
 }
 
 /// Numbers packets through all drives, as of the parts of one recording.
@@ -171,7 +192,8 @@ private:
         _find.bind(1, drive.recording.id);
         while (_find.step()) {
             const auto kind = eventKindNamed(_find.text(2));
-            const Time time(std::chrono::microseconds(_find.integer(0)));
+            const Time time = timeOf(_find.integer(0) / kMicroseconds) +
+                              std::chrono::microseconds(_find.integer(0) % kMicroseconds);
             if (kind && _window.contains(time)) {
                 _events.push_back({*kind,
                                    time,
@@ -220,9 +242,10 @@ StoredReport reportOf(const StoredReportRequest& request, const StoredReportKnow
     std::vector<StoredDrive> drives = drivesOf(*store, device);
     const DecodeWindow window = windowOf(request, drives, knowledge.zone);
     std::erase_if(drives, [&window](const StoredDrive& drive) {
-        return drive.last < window.from() || drive.recording.first > window.to();
+        return drive.recording.last < window.from() || drive.recording.first > window.to();
     });
     const RecordedTechnology& technology = technologyOf(drives, request, device);
+    refuseTooMuch(drives);
     FieldTable fields(technology, knowledge.resources);
     // Identities are not in a store, at most their pseudonyms, which stay out as well.
     ReportBuilder report(knowledge.names, knowledge.profile,

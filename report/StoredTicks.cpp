@@ -61,6 +61,13 @@ Names fieldsOfReport(std::string_view technology) {
     return names;
 }
 
+/// Of milliseconds after the start, of which a file may have any.
+Time storedTime(const StoredTicks::Recording& recording, std::int64_t after) {
+    const auto most =
+        std::chrono::floor<milliseconds>(recording.last - recording.first + TickGrid::kInterval);
+    return recording.first + milliseconds(std::clamp<std::int64_t>(after, 0, most.count()));
+}
+
 } // namespace
 
 StoredTicks::StoredTicks(StoreConnection& store, FieldTable& fields, EntryTable& entries)
@@ -106,26 +113,27 @@ void StoredTicks::read(const Recording& recording) {
     for (const FieldIndex field : _wanted) {
         _intervals.bind(1, _fields[field].name).bind(2, recording.id);
         while (_intervals.step()) {
-            _held.push_back(readRow(field, recording.first));
+            _held.push_back(readRow(field, recording));
         }
     }
     std::stable_sort(_held.begin(), _held.end(),
                      [](const Held& one, const Held& other) { return one.packet < other.packet; });
 }
 
-StoredTicks::Held StoredTicks::readRow(FieldIndex field, Time first) {
+StoredTicks::Held StoredTicks::readRow(FieldIndex field, const Recording& recording) {
     enum IntervalColumn : int { kEntry, kStart, kEnd, kPacket, kNumber, kText, kRaw };
     Held held{field,
               0,
               kNoEntry,
-              first + milliseconds(_intervals.integer(kStart)),
-              first + milliseconds(_intervals.integer(kEnd)),
+              storedTime(recording, _intervals.integer(kStart)),
+              storedTime(recording, _intervals.integer(kEnd)),
               static_cast<std::uint64_t>(_intervals.integer(kPacket)),
               {}};
     if (!_intervals.isNull(kEntry)) {
         held.list = listOf(field);
         held.entry = _entries.entry(held.list, kNoEntry, _intervals.text(kEntry));
     }
+    held.end = std::max(held.end, held.start);
     held.value.shown = PropertyList(_intervals.text(kText));
     if (!_intervals.isNull(kNumber)) {
         held.value.number = _intervals.real(kNumber);
@@ -153,13 +161,20 @@ void StoredTicks::walkStretch(const Range& stretch, Time tick, const Take& take)
         for (; next != past && next->start <= tick; ++next) {
             _current[{next->entry, next->field}] = &*next;
         }
-        // The values of the last tick have no time of their own.
-        std::erase_if(_current, [tick, end](const auto& each) {
-            return each.second->end < tick || (each.second->end == tick && tick != end);
+        std::erase_if(_current, [tick](const auto& each) { return each.second->end < tick; });
+        // Those of the last tick, at which all end, have no time of their own.
+        const bool goesOn = std::any_of(_current.begin(), _current.end(), [tick](const auto& each) {
+            return each.second->end > tick;
+        });
+        std::erase_if(_current, [tick, goesOn](const auto& each) {
+            return goesOn && each.second->end == tick;
         });
         if (!_current.empty()) {
             show(tick);
             take(tick, _values, packet);
+        } else if (next != past) { // on the grid, little before what comes next
+            constexpr std::chrono::nanoseconds kLeast{1};
+            tick += (next->start - tick - kLeast) / TickGrid::kInterval * TickGrid::kInterval;
         }
     }
 }

@@ -22,6 +22,7 @@ public:
     struct Recording {
         std::int64_t id = 0;
         Time first;
+        Time last;                ///< nothing holds much longer
         bool isOfPackets = false; ///< it has the values of each packet, not those of the ticks
     };
     /// Calls `take` at each tick at which something is known, with the values that are known then
@@ -42,7 +43,7 @@ private:
     using Range = std::pair<std::vector<Held>::iterator, std::vector<Held>::iterator>;
 
     void read(const Recording& recording);
-    Held readRow(FieldIndex field, Time first);
+    Held readRow(FieldIndex field, const Recording& recording);
     ListId listOf(FieldIndex field);
     void walkStretch(const Range& stretch, Time tick, const Take& take);
     void show(Time tick);

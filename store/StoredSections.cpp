@@ -107,7 +107,7 @@ private:
         }
         held.push_back({_intervals.text(0), first + _intervals.integer(1),
                         first + _intervals.integer(2), field, _intervals.integer(3),
-                        _intervals.isNull(4) ? 0 : _places.at(_intervals.integer(4)),
+                        _intervals.isNull(4) ? 0 : _places[_intervals.integer(4)],
                         valueOf(*_fields[field])});
     }
     /// As the tables of a recording have it.

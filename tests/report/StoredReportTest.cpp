@@ -222,6 +222,37 @@ TEST_F(StoredReportTest, WhatCannotBeReportedIsASentence) {
     EXPECT_EQ(refusal(request), request.file + " is no file of SQLite.");
 }
 
+TEST_F(StoredReportTest, AGapOfWeeksIsPassedAtOnce) {
+    drive(1, std::chrono::seconds(10));
+    const JournalPacket last = journal.packet(journal.size());
+    journal.add(last.time + std::chrono::hours(24 * 50),
+                ByteBuffer(last.data.begin(), last.data.end()));
+    (void)load(write("drive.pcap"));
+    const Json head = figures(whole())["head"];
+    EXPECT_EQ(head["gaps"], 1);
+    EXPECT_EQ(head["ticks"], ofRecording()["head"]["ticks"]);
+}
+
+TEST_F(StoredReportTest, NumbersOfAFileThatNobodyWroteAreASentenceOrAReport) {
+    drive(1, std::chrono::seconds(10));
+    (void)load(write("drive.pcap"));
+    const auto change = [&](const char* sql) {
+        MeasurementStore store(file);
+        store.connection().run(sql);
+    };
+    change("UPDATE intervals SET hold = 9000000000000000000 WHERE id % 2");
+    change("UPDATE intervals SET time = -9000000000000000000 WHERE id % 3 = 0");
+    change("UPDATE events SET time = -9223372036854775807");
+    EXPECT_LE(figures(whole())["head"]["ticks"].get<int>(), 20);
+    change("UPDATE intervals SET hold = -9000000000000000000");
+    change("DELETE FROM sites");
+    change("UPDATE series SET step = 'x', format = '%s%n%q', last_row = 9000000000000000000");
+    (void)made(whole()); // whatever it says, it ends
+    change("UPDATE recordings SET first = -9000000000000000000, last = 9000000000000000000");
+    EXPECT_EQ(refusal(whole()), "The recordings of that time last more than 100 days, which is too "
+                                "much for a page; choose less with --from and --to.");
+}
+
 TEST_F(StoredReportTest, SeveralDevicesMustBeChosenFrom) {
     drive(1, std::chrono::seconds(10));
     (void)load(write("one.pcap"));

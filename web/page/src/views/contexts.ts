@@ -1,14 +1,13 @@
 import { button, h, section, table, type Cell } from '../dom.js';
 import { clockText, durationText } from '../logic/text.js';
 import type { Model } from '../model.js';
-import { contextName } from './timeline.js';
 
 /** The data connections, with each state that they had. */
 export function contextsView(model: Model): HTMLElement {
     const place = h('div');
     const draw = (): void => {
-        const rows = model.figures.contexts.flatMap((lane, i) => {
-            const name = contextName(lane.name, i);
+        const rows = model.figures.contexts.flatMap((lane) => {
+            const name = lane.name;
             return [...new Set(lane.spans.map((span) => span.text))].map((text): Cell[] => {
                 const spans = lane.spans.filter((span) => span.text === text);
                 const first = spans[0]!;

@@ -63,14 +63,9 @@ function lanesOf(model: Model, before: Map<string, HTMLElement>): HTMLElement[] 
             text: stay.cell.replace(/^\S+ (?=\S+$)/, ''), colour: model.colours.of(stay.cell), isMarked: stay.pingPong }))));
     const states = figures.states.map(({ name }) => lane(`state ${name}`, model, name,
         () => spansOfLane(model, model.figures.states.find((each) => each.name === name), 0)));
-    const contexts = figures.contexts.map(({ name }, i) => lane(`context ${name}`, model, contextName(name, i),
+    const contexts = figures.contexts.map(({ name }) => lane(`context ${name}`, model, name,
         () => spansOfLane(model, model.figures.contexts.find((each) => each.name === name), 2)));
     return [...cells, ...states, ...contexts, lane('events', model, 'Events', () => eventSpans(model.inStretch(model.figures.events)), true)];
-}
-
-/** The name of a context is masked with the rest of it. */
-export function contextName(name: string, place: number): string {
-    return /^0*$/.test(name) ? `context ${place + 1}` : name;
 }
 
 function keysOf(model: Model): Record<string, () => void> {
