@@ -10,7 +10,8 @@ namespace {
 
 using doubles::FakeServer;
 
-constexpr Patience kImpatient{std::chrono::milliseconds(500), std::chrono::milliseconds(100), {}, {}};
+constexpr Patience kImpatient{
+    std::chrono::milliseconds(500), std::chrono::milliseconds(100), {}, {}};
 
 std::string answer(const std::string& body, const std::string& status = "200 OK") {
     return "HTTP/1.1 " + status + "\r\nContent-Length: " + std::to_string(body.size()) +
