@@ -32,7 +32,7 @@ TEST(RowBinaryTest, TextsHaveTheirLengthInGroupsOfSevenBits) {
     RowBinary row;
     row.add("").add(std::string("a\0b", 3));
     EXPECT_EQ(row.bytes(), bytes({0, 3, 'a', 0, 'b'}));
-    for (const std::size_t length : {127, 128, 16383, 16384}) {
+    for (const std::size_t length : {127U, 128U, 16383U, 16384U}) {
         row.clear();
         row.add(std::string(length, 'x'));
         const std::string prefix = length == 127     ? bytes({127})

@@ -165,7 +165,6 @@ TEST_F(Cluster, ALoadThatIsKilledAndRepeatedGivesTheSame) {
     const int kills = wanted != nullptr ? std::atoi(wanted) : 5; // NOLINT(cert-err34-c)
     std::mt19937 random(1); // NOLINT(*-msc51-cpp): the same moments each time
     int ended = 0;
-    std::size_t between = 0; ///< stores that had one recording and a part of the other
     for (int kill = 0; kill < kills; ++kill) {
         PallaxProcess loading(world,
                               {"store", "load", "--jobs", "1", "--into", store, first, second});
@@ -189,7 +188,6 @@ TEST_F(Cluster, ALoadThatIsKilledAndRepeatedGivesTheSame) {
                               "'') group by recording order by recording"}),
             seen);
         if (!isKilled || kill % 10 == 9) { // begin again
-            between += 1;
             ASSERT_EQ(run({"store", "load", "--into", store, first, second}).status, 0);
             EXPECT_EQ(content(store), expected);
             const std::string database = "again" + std::to_string(kill);
@@ -203,6 +201,7 @@ TEST_F(Cluster, ALoadThatIsKilledAndRepeatedGivesTheSame) {
         }
     }
     EXPECT_GT(ended, kills / 5) << "of " << kills;
+    RecordProperty("kills", ended);
     ASSERT_EQ(run({"store", "load", "--into", store, first, second}).status, 0);
     EXPECT_EQ(content(store), expected);
 }

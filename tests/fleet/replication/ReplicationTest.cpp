@@ -32,9 +32,14 @@ protected:
                 recordings[loader].push_back(
                     simulated(device + ".pcap", 400, loader * kRecordingsOfLoader + recording));
             }
+            late[loader] = simulated("late" + std::to_string(loader) + ".pcap", 20, 100 + loader);
         }
     }
 
+    Run loadLate(const std::string& into, int loader) {
+        return run({"store", "load", "--into", into, "--device", "car" + std::to_string(loader),
+                    late[loader]});
+    }
     std::vector<std::string> arguments(const std::string& into, int loader) {
         std::vector<std::string> words{
             "store",  "load", "--jobs",   "1",
@@ -58,15 +63,17 @@ protected:
 
     PrivateServers servers{2, 2};
     std::map<int, std::vector<std::string>> recordings;
+    std::map<int, std::string> late; ///< loaded while a server is missing
     std::string file = world.path("store.db");
 };
 
 TEST_F(Replication, FourLoadersAndAServerThatDiesLoseAndDoubleNothing) {
     for (int loader = 1; loader <= kLoaders; ++loader) {
         ASSERT_EQ(run(arguments(file, loader)).status, 0);
+        ASSERT_EQ(loadLate(file, loader).status, 0);
     }
     const auto expected = seen(file);
-    ASSERT_EQ(expected.size(), std::size_t{kLoaders * kRecordingsOfLoader});
+    ASSERT_EQ(expected.size(), std::size_t{kLoaders * (kRecordingsOfLoader + 1)});
     int looks = 0;
     const auto look = [&](int server) {
         for (const auto& [recording, rows] : seen(servers.address(server))) {
@@ -101,6 +108,21 @@ TEST_F(Replication, FourLoadersAndAServerThatDiesLoseAndDoubleNothing) {
     look(1);
     look(2);
     look(3);
+    int refused = 0; // by the shard that lacks a copy
+    for (int loader = 1; loader <= kLoaders; ++loader) {
+        const Run loaded = loadLate(servers.address(1), loader);
+        const bool isSeen =
+            seen(servers.address(1)).count("late" + std::to_string(loader) + ".pcap") > 0;
+        EXPECT_EQ(isSeen, loaded.status == 0) << loaded.err;
+        if (loaded.status != 0) {
+            EXPECT_TRUE(loaded.err.ends_with(": not all copies of a shard have what was sent; "
+                                             "nothing was loaded.\n"))
+                << loaded.err;
+            ++refused;
+        }
+    }
+    EXPECT_GT(refused, 0);
+    EXPECT_LT(refused, kLoaders);
     const std::size_t before = seen(servers.address(1)).size();
     servers.start(kDying);
     // It takes a while until it may write again.
@@ -109,6 +131,7 @@ TEST_F(Replication, FourLoadersAndAServerThatDiesLoseAndDoubleNothing) {
         Run again{1, "", ""};
         for (int attempt = 0; attempt < 30 && again.status != 0; ++attempt, ++rounds) {
             again = run(arguments(servers.address(loader), loader));
+            again.status = std::max(again.status, loadLate(servers.address(1), loader).status);
             look(kDying);
             std::this_thread::sleep_for(std::chrono::milliseconds(again.status == 0 ? 0 : 500));
         }
@@ -120,7 +143,8 @@ TEST_F(Replication, FourLoadersAndAServerThatDiesLoseAndDoubleNothing) {
         EXPECT_EQ(this->content(servers.address(server)), content) << "server " << server;
     }
     std::cout << kLoaders << " loaders, of which " << failed << " failed when a server died; "
-              << before << " of " << expected.size() << " recordings were there then, " << looks
+              << refused << " of " << kLoaders << " later loads were refused; " << before << " of "
+              << expected.size() << " recordings were there then, " << looks
               << " looks at a recording found it whole; repeated with " << rounds
               << " runs, all four servers have the content of the file.\n";
 }
