@@ -279,6 +279,9 @@ ParsedOptions askOptions(const StoreRequest& request) {
 
 ParsedOptions setupOptions(const StoreRequest& request) {
     const auto& words = request.words;
+    if (const std::string refusal = refusalOf(request, "setup"); !refusal.empty()) {
+        return wrongUsage(refusal, "store");
+    }
     if (words.size() > 2) {
         return wrongUsage("setup takes one or two clusters", "store");
     }

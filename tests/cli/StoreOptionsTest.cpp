@@ -85,6 +85,7 @@ TEST(StoreOptions, WhatAnActionDoesNotTakeIsRefused) {
     says({"load", "a", "--every", "1m"}, "load: --every takes tick or packet");
     says({"watch", "a", "--jobs", "2"}, "watch takes no --jobs");
     says({"watch", "a", "--timeout", "2"}, "watch takes no --timeout");
+    says({"setup", "fleet", "--device", "car1"}, "setup takes no --device");
     says({"query", "devices", "--jobs", "2"}, "devices takes no --jobs");
     says({"query", "devices", "--to", "end"}, "devices takes no --to");
     says({"query", "recordings", "--profile", "field"}, "recordings takes no --profile");

@@ -2,6 +2,7 @@
 
 #include "decoding/DisplayJson.h"
 #include "report/ReportWalk.h"
+#include "store/FileStore.h"
 #include "tests/store/StoreFixture.h"
 
 #include <gtest/gtest.h>
@@ -204,7 +205,7 @@ TEST_F(StoredReportTest, OfARecordingWithTheValuesOfEachPacketHasTicksToo) {
 TEST_F(StoredReportTest, WhatCannotBeReportedIsASentence) {
     StoredReportRequest request = whole();
     EXPECT_EQ(refusal(request), "There is no store " + file + " (see pallax store load).");
-    { const MeasurementStore empty(file); }
+    { const FileStore empty(file); }
     EXPECT_EQ(refusal(request), "The store " + file + " is empty (see pallax store load).");
     drive(1, std::chrono::seconds(10));
     (void)load(write("drive.pcap"));
