@@ -80,15 +80,23 @@ TEST_F(EndToEndWindow, ADemoRunsUntilItIsEnded) {
                                             "has 'UMTS RR Info'"));
 }
 
+TEST_F(EndToEndWindow, TimeIsHeldSteppedAndReleased) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key space "
+                       "has '22:15:19, held' press 'Tick before' has '22:15:18, held*' "
+                       "press 'To the present' lacks '22:15:18, held*' has '22:15:19'"));
+}
+
 TEST_F(EndToEndWindow, ClosingTheWindowEndsTheProgram) {
     expectDriven(drive("demo", "has 'SIM Info' press Close lacks 'SIM Info'"));
 }
 
 TEST_F(EndToEndWindow, ASnapshotIsSaved) {
     const std::string folder = offerSaving(world.path("marker"));
-    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
-                       "has 'SIM Info' press Save has 'DLF binary*' type 'tunnel entrance' "
-                       "press Save lacks 'DLF binary*' has 'Saved *'"));
+    expectDriven(
+        drive(sample("lte-drive.pcap") + " --speed max",
+              "has 'SIM Info' press Save has 'DLF binary*' type 'Description=tunnel entrance' "
+              "press Save lacks 'DLF binary*' has 'Saved *'"));
     std::string content;
     for (const auto& entry : std::filesystem::directory_iterator(folder)) {
         std::ifstream file(entry.path());
