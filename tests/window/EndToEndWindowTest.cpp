@@ -83,8 +83,9 @@ TEST_F(EndToEndWindow, ADemoRunsUntilItIsEnded) {
 TEST_F(EndToEndWindow, TimeIsHeldSteppedAndReleased) {
     expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
                        "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key space "
-                       "has '22:15:19, held' press 'Tick before' has '22:15:18, held*' "
-                       "press 'To the present' lacks '22:15:18, held*' has '22:15:19'"));
+                       "has Play press 'Event before' has '22:15:19, held*' "
+                       "press 'Event before' has '22:15:18, held*' "
+                       "press 'To the present' lacks '22:15:18, held*' has Hold"));
 }
 
 TEST_F(EndToEndWindow, ClosingTheWindowEndsTheProgram) {
