@@ -7,6 +7,7 @@
 #include "host/Interruption.h"
 #include "ui/gtk/Menu.h"
 #include "ui/gtk/ShownText.h"
+#include "ui/gtk/Translation.h"
 #include "window/GlibTurns.h"
 #include "window/Programs.h"
 #include "window/WindowSession.h"
@@ -72,15 +73,16 @@ private:
             };
         };
         std::vector<std::vector<gtk::MenuEntry>> sections{
-            {{"overview", "Overview", [this] { _frame.toggleDetail(); }},
-             {"search", "Search Rows", [this] { _frame.toggleSearch(); }},
-             {"time", "Time Bar", onSession(&WindowSession::toggleTimeBar)}},
-            {{"safe", "Hide Identities", onSession(&WindowSession::toggleSafe),
+            {{"overview", gtk::translated("Overview"), [this] { _frame.toggleDetail(); }},
+             {"search", gtk::translated("Search Rows"), [this] { _frame.toggleSearch(); }},
+             {"time", gtk::translated("Time Bar"), onSession(&WindowSession::toggleTimeBar)}},
+            {{"safe", gtk::translated("Hide Identities"), onSession(&WindowSession::toggleSafe),
               [this] { return _session && _session->isSafe(); }},
-             {"afresh", "Start Afresh", onSession(&WindowSession::startAfresh)}},
-            {{"open", "Open Recording…", [this] { chooseRecording(); }}}};
+             {"afresh", gtk::translated("Start Afresh"), onSession(&WindowSession::startAfresh)}},
+            {{"open", gtk::translated("Open Recording…"), [this] { chooseRecording(); }}}};
         if (!_recording.empty() && _recording != "-") {
-            sections.back().push_back({"report", "Report in the Browser", [this] { report(); }});
+            sections.back().push_back(
+                {"report", gtk::translated("Report in the Browser"), [this] { report(); }});
         }
         return sections;
     }
@@ -103,7 +105,7 @@ private:
 
     /// An alarm of the settings, as a notice of the desktop.
     void notify(const std::string& name) {
-        const gtk::Ref<GNotification> notice(g_notification_new("Alarm"));
+        const gtk::Ref<GNotification> notice(g_notification_new(gtk::translated("Alarm")));
         g_notification_set_body(notice.get(), gtk::shownText(name).c_str());
         g_application_send_notification(G_APPLICATION(_application), "alarm", notice.get());
     }
@@ -112,7 +114,8 @@ private:
     void open(const std::string& path) {
         runBeside(_queue, {windowProgram(), path}, [this](const std::string& complaint) {
             if (!complaint.empty()) {
-                _frame.showAlert({"Cannot Open", complaint, "Close"});
+                _frame.showAlert(
+                    {gtk::translated("Cannot Open"), complaint, gtk::translated("Close")});
             }
         });
     }
@@ -129,7 +132,8 @@ private:
 
     void chooseRecording() {
         _chooser = gtk::Ref<GtkFileChooserNative>(gtk_file_chooser_native_new(
-            "Open Recording", _frame.window(), GTK_FILE_CHOOSER_ACTION_OPEN, "Open", "Cancel"));
+            gtk::translated("Open Recording"), _frame.window(), GTK_FILE_CHOOSER_ACTION_OPEN,
+            gtk::translated("Open"), gtk::translated("Cancel")));
         const auto answered = [this](int response) {
             if (response == GTK_RESPONSE_ACCEPT) {
                 const gtk::Ref<GFile> file(
@@ -158,14 +162,15 @@ private:
         std::filesystem::create_directories(folder, ignored);
         const std::string page =
             folder / (std::filesystem::path(_recording).filename().string() + ".html");
-        _frame.setMessage("Making a report…");
+        _frame.setMessage(gtk::translated("Making a report…"));
         runBeside(_queue, {terminalProgram(), "report", _recording, "-o", page},
                   [this, page](const std::string& complaint) {
                       if (complaint.empty()) {
                           gtk_show_uri(_frame.window(), ("file://" + page).c_str(),
                                        GDK_CURRENT_TIME);
                       } else {
-                          _frame.showAlert({"No Report", complaint, "Close"});
+                          _frame.showAlert(
+                              {gtk::translated("No Report"), complaint, gtk::translated("Close")});
                       }
                   });
     }
@@ -180,10 +185,21 @@ private:
     gtk::Ref<GtkFileChooserNative> _chooser; ///< the latest
 };
 
+/// Beside the program where it was built, or where it is installed.
+std::string translationsFolder() {
+    const std::filesystem::path folder = std::filesystem::path(windowProgram()).parent_path();
+    std::error_code missing;
+    return std::filesystem::exists(folder / "locale", missing)
+               ? (folder / "locale").string()
+               : (folder.parent_path() / "share/locale").string();
+}
+
 } // namespace
 
 ExitStatus runWindow(const BrowseOptions& options) {
     const Interruption interruption;
+    gtk_disable_setlocale(); // numbers are written and read in the same way everywhere
+    gtk::useTranslations(translationsFolder().c_str());
     if (gtk_init_check() == FALSE) {
         complain("There is no display for a window; pallax shows the same in a terminal.");
         return kExitFailure;

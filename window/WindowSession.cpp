@@ -1,6 +1,7 @@
 #include "window/WindowSession.h"
 
 #include "timeline/Timeline.h"
+#include "ui/gtk/Translation.h"
 
 #include <chrono>
 #include <utility>
@@ -32,7 +33,7 @@ WindowSession::WindowSession(Setup setup)
       _instant(_viewer.travel(), _toolkit), _timeBar(setup.guard, timeActions()) {
     gtk_widget_set_visible(_timeBar.widget(), FALSE);
     _viewer.attach(_toolkit);
-    _frame.setDetail(_overview.widget(), "Overview");
+    _frame.setDetail(_overview.widget(), gtk::translated("Overview"));
     if (setup.request.settings.firstScreen == FirstScreen::Overview) {
         _frame.toggleDetail();
     }
@@ -167,10 +168,12 @@ void WindowSession::toggleTimeBar() {
 
 void WindowSession::toggleSafe() {
     if (_staysSafe) {
-        return _frame.setMessage("The viewer was started with --safe and stays so.");
+        return _frame.setMessage(
+            gtk::translated("The viewer was started with --safe and stays so."));
     }
     if (!_viewer.canStartAfresh()) {
-        return _frame.setMessage("A stream can be played only once: start the viewer with --safe.");
+        return _frame.setMessage(
+            gtk::translated("A stream can be played only once: start the viewer with --safe."));
     }
     _isSafe = !_isSafe;
     forgetInstant();

@@ -88,6 +88,16 @@ TEST_F(EndToEndWindow, TimeIsHeldSteppedAndReleased) {
                        "press 'To the present' lacks '22:15:18, held*' has Hold"));
 }
 
+TEST_F(EndToEndWindow, SpeaksGermanButKeepsTheModemsTexts) {
+    if (!std::filesystem::exists(PALLAX_BINARY_DIR "/locale")) {
+        GTEST_SKIP() << "gettext is not installed";
+    }
+    world.environment.insert(world.environment.end(), {"LANG=C.UTF-8", "LANGUAGE=de"});
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Menü' has 'Netzbetreiber' has 'Serving Cell Info' "
+                       "has 'Updated 2023-11-14 at 22:15:20'"));
+}
+
 TEST_F(EndToEndWindow, ClosingTheWindowEndsTheProgram) {
     expectDriven(drive("demo", "has 'SIM Info' press Close lacks 'SIM Info'"));
 }

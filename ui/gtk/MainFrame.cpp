@@ -3,6 +3,7 @@
 #include "ui/gtk/SaveScreen.h"
 #include "ui/gtk/ShownText.h"
 #include "ui/gtk/Style.h"
+#include "ui/gtk/Translation.h"
 #include "ui/gtk/WidgetTable.h"
 
 #include <utility>
@@ -37,7 +38,7 @@ MainFrame::MainFrame(GtkApplication* application, const Guard& guard, Actions ac
       _toolbar(GTK_BOX(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 8))),
       _spinner(GTK_SPINNER(gtk_spinner_new())), _status(GTK_LABEL(gtk_label_new(nullptr))),
       _remarks(GTK_LABEL(gtk_label_new(nullptr))),
-      _save(GTK_BUTTON(gtk_button_new_with_label("Save"))) {
+      _save(GTK_BUTTON(gtk_button_new_with_label(translated("Save")))) {
     addStyle();
     build();
     listen();
@@ -54,7 +55,7 @@ void MainFrame::build() {
     gtk_window_set_title(window(), "Pallax");
     gtk_window_set_default_size(window(), kUsualWidth, kUsualHeight);
     gtk_widget_set_size_request(_window.get(), kLeastWidth, kLeastHeight);
-    nameWidget(GTK_WIDGET(_back), "Back");
+    nameWidget(GTK_WIDGET(_back), translated("Back"));
     gtk_widget_set_visible(GTK_WIDGET(_back), FALSE);
     adw_header_bar_pack_start(_header, GTK_WIDGET(_back));
     adw_header_bar_set_title_widget(_header, GTK_WIDGET(_title));
@@ -82,13 +83,21 @@ GtkWidget* MainFrame::buildToolbar() {
     gtk_widget_set_visible(toolbar, FALSE);
     gtk_widget_set_visible(GTK_WIDGET(_spinner), FALSE);
     gtk_widget_set_visible(GTK_WIDGET(_save), FALSE);
-    nameWidget(GTK_WIDGET(_spinner), "Connecting");
-    gtk_widget_add_css_class(GTK_WIDGET(_remarks), "dim-label");
-    gtk_label_set_ellipsize(_remarks, PANGO_ELLIPSIZE_END);
-    gtk_label_set_xalign(_remarks, 0);
-    gtk_widget_set_hexpand(GTK_WIDGET(_remarks), TRUE);
-    for (GtkWidget* child :
-         {GTK_WIDGET(_spinner), GTK_WIDGET(_status), GTK_WIDGET(_remarks), GTK_WIDGET(_save)}) {
+    gtk_widget_set_valign(GTK_WIDGET(_save), GTK_ALIGN_CENTER);
+    nameWidget(GTK_WIDGET(_spinner), translated("Connecting"));
+    GtkWidget* texts = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
+    gtk_widget_set_hexpand(texts, TRUE);
+    gtk_widget_set_valign(texts, GTK_ALIGN_CENTER);
+    for (GtkLabel* label : {_status, _remarks}) {
+        gtk_label_set_ellipsize(label, PANGO_ELLIPSIZE_END);
+        gtk_label_set_xalign(label, 0);
+        gtk_box_append(GTK_BOX(texts), GTK_WIDGET(label));
+    }
+    for (const char* look : {"dim-label", "caption"}) {
+        gtk_widget_add_css_class(GTK_WIDGET(_remarks), look);
+    }
+    showText(_remarks, "");
+    for (GtkWidget* child : {GTK_WIDGET(_spinner), texts, GTK_WIDGET(_save)}) {
         gtk_box_append(_toolbar, child);
     }
     return toolbar;
@@ -179,7 +188,7 @@ void MainFrame::buildSearch() {
     gtk_search_bar_set_child(_searchBar, GTK_WIDGET(_search));
     gtk_search_bar_connect_entry(_searchBar, GTK_EDITABLE(_search));
     gtk_widget_set_hexpand(GTK_WIDGET(_search), TRUE);
-    nameWidget(GTK_WIDGET(_search), "Show rows that contain a text");
+    nameWidget(GTK_WIDGET(_search), translated("Show rows that contain a text"));
     onSignal(_search, "search-changed", _guard, [this] { filter(); });
     onSignal(_searchBar, "notify::search-mode-enabled", _guard, [this] {
         if (gtk_search_bar_get_search_mode(_searchBar) == FALSE) {
@@ -287,7 +296,7 @@ void MainFrame::setStream(std::string state) {
 void MainFrame::setAlarms(const std::vector<std::string>& names) {
     _alarms.clear();
     for (const std::string& alarm : names) {
-        _alarms += (_alarms.empty() ? "alarm: " : ", ") + alarm;
+        _alarms += (_alarms.empty() ? translated("alarm: ") : ", ") + alarm;
     }
     showRemarks();
 }
@@ -299,7 +308,7 @@ void MainFrame::showRemarks() {
             text += (text.empty() ? "" : " · ") + *part;
         }
     }
-    gtk_label_set_text(_remarks, shownText(text).c_str());
+    showText(_remarks, text);
     gtk_widget_set_tooltip_text(GTK_WIDGET(_remarks),
                                 text.empty() ? nullptr : shownText(text).c_str());
 }
@@ -310,7 +319,8 @@ void MainFrame::setOrigin(const std::string& technology, const std::string& sour
 }
 
 void MainFrame::setOldValues(const std::string& time) {
-    showText(_oldValues, time.empty() ? "" : "The link was restarted: values from before " + time);
+    showText(_oldValues,
+             time.empty() ? "" : translated("The link was restarted: values from before ") + time);
 }
 
 void MainFrame::showEnded(const std::string& sentence) {
@@ -318,9 +328,9 @@ void MainFrame::showEnded(const std::string& sentence) {
     gtk_box_append(GTK_BOX(page), adw_header_bar_new());
     GtkWidget* status = adw_status_page_new();
     adw_status_page_set_icon_name(ADW_STATUS_PAGE(status), "dialog-error-symbolic");
-    adw_status_page_set_title(ADW_STATUS_PAGE(status), "Pallax has stopped");
+    adw_status_page_set_title(ADW_STATUS_PAGE(status), translated("Pallax has stopped"));
     adw_status_page_set_description(ADW_STATUS_PAGE(status), shownMarkup(sentence).c_str());
-    GtkWidget* close = gtk_button_new_with_label("Close");
+    GtkWidget* close = gtk_button_new_with_label(translated("Close"));
     gtk_widget_add_css_class(close, "pill");
     gtk_widget_set_halign(close, GTK_ALIGN_CENTER);
     onSignal(close, "clicked", _guard, [this] { _guard.queue().async(_actions.closed); });

@@ -2,6 +2,7 @@
 
 #include "ui/gtk/Ref.h"
 #include "ui/gtk/ShownText.h"
+#include "ui/gtk/Translation.h"
 
 namespace pallax::gtk {
 
@@ -42,7 +43,7 @@ GtkWidget* menuButton(GtkWindow* window, const Guard& guard,
     gtk_menu_button_set_icon_name(GTK_MENU_BUTTON(button), "open-menu-symbolic");
     gtk_menu_button_set_menu_model(GTK_MENU_BUTTON(button), G_MENU_MODEL(menu.get()));
     gtk_menu_button_set_primary(GTK_MENU_BUTTON(button), TRUE);
-    nameWidget(button, "Menu");
+    nameWidget(button, translated("Menu"));
     return button;
 }
 

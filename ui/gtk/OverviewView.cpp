@@ -3,6 +3,7 @@
 #include "overview/StatusWords.h"
 #include "text/Date.h"
 #include "ui/gtk/ShownText.h"
+#include "ui/gtk/Translation.h"
 
 #include <algorithm>
 #include <utility>
@@ -57,7 +58,7 @@ void OverviewView::show(const Overview& overview) {
 
 void OverviewView::addCells(std::vector<Group>& groups, const Status& status) {
     for (const StatusCell& cell : status.cells) {
-        Group group{cell.system + " cell", {}};
+        Group group{cell.system + translated(" cell"), {}};
         std::vector<std::string> where = channelWords(cell);
         where.insert(where.end(), cell.details.begin(), cell.details.end());
         group.rows.push_back({joined(identityWords(cell)), joined(where)});
@@ -80,31 +81,31 @@ std::vector<OverviewView::Group> OverviewView::groupsOf(const Overview& overview
         }
     };
     if (status.network) {
-        add("Operator",
-            {{operatorWords(*status.network), status.network->isHome ? "home network" : ""}});
+        add(translated("Operator"), {{operatorWords(*status.network),
+                                      status.network->isHome ? translated("home network") : ""}});
     }
     addCells(groups, status);
     std::vector<Row> rows;
     for (const StatusValue& state : status.states) {
         rows.push_back({state.name, "", state.text});
     }
-    add("States", std::exchange(rows, {}));
+    add(translated("States"), std::exchange(rows, {}));
     for (const StatusNeighbour& neighbour : status.neighbours) {
         const std::string age =
             isOld(status.time, neighbour.level) ? ageWords(status.time - neighbour.level.read) : "";
         rows.push_back({neighbour.cell, joined({neighbour.system, age}), neighbour.level.text,
                         shareOf(neighbour.level)});
     }
-    add("Neighbours", std::exchange(rows, {}));
+    add(translated("Neighbours"), std::exchange(rows, {}));
     for (const StatusContext& context : status.contexts) {
         rows.push_back({context.name, "", context.state});
     }
-    add("Contexts", std::exchange(rows, {}));
+    add(translated("Contexts"), std::exchange(rows, {}));
     for (auto event = overview.events.rbegin();
          event != overview.events.rend() && rows.size() < kMostEvents; ++event) {
         rows.push_back({event->words, timeOfDay(event->time, overview.ahead)});
     }
-    add("Events", std::move(rows));
+    add(translated("Events"), std::move(rows));
     return groups;
 }
 
@@ -117,7 +118,8 @@ void OverviewView::build(const std::vector<Group>& groups) {
     if (groups.empty()) {
         GtkWidget* nothing = adw_status_page_new();
         adw_status_page_set_icon_name(ADW_STATUS_PAGE(nothing), "network-wireless-symbolic");
-        adw_status_page_set_title(ADW_STATUS_PAGE(nothing), "Nothing is known about the radio.");
+        adw_status_page_set_title(ADW_STATUS_PAGE(nothing),
+                                  translated("Nothing is known about the radio."));
         gtk_widget_set_vexpand(nothing, TRUE);
         return gtk_box_append(_page.get(), nothing);
     }

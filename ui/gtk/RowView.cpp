@@ -1,6 +1,7 @@
 #include "ui/gtk/RowView.h"
 
 #include "ui/gtk/ShownText.h"
+#include "ui/gtk/Translation.h"
 
 #include <algorithm>
 #include <cmath>
@@ -40,10 +41,10 @@ std::string spokenName(const ui::CellContents& contents, const RowNotes& notes) 
         name += ", " + notes.count;
     }
     if (notes.hasChanged) {
-        name += ", changed";
+        name += translated(", changed");
     }
     if (!notes.age.empty()) {
-        name += ", " + notes.age + " old";
+        name += ", " + notes.age + translated(" old");
     }
     return name;
 }

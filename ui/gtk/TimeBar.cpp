@@ -1,6 +1,7 @@
 #include "ui/gtk/TimeBar.h"
 
 #include "ui/gtk/ShownText.h"
+#include "ui/gtk/Translation.h"
 
 #include <utility>
 
@@ -20,7 +21,7 @@ TimeBar::TimeBar(const Guard& guard, Actions actions)
       _scale(GTK_SCALE(gtk_scale_new_with_range(GTK_ORIENTATION_HORIZONTAL, 0, 1, kFinestStep))),
       _words(GTK_LABEL(gtk_label_new(nullptr))) {
     gtk_widget_add_css_class(widget(), "pallax-toolbar");
-    nameWidget(GTK_WIDGET(_scale), "Time");
+    nameWidget(GTK_WIDGET(_scale), translated("Time"));
     onSignal(_scale, "value-changed", guard, [this] {
         if (!_isShowing) {
             _actions.toShare(gtk_range_get_value(GTK_RANGE(_scale)));
@@ -47,18 +48,22 @@ GtkWidget* TimeBar::addButton(GtkBox* to, const char* icon, const char* text, Wi
 }
 
 void TimeBar::buildButtons(GtkBox* to) {
-    (void)addButton(to, "media-skip-backward-symbolic", "Event before", Wish::EventBack);
-    (void)addButton(to, "go-previous-symbolic", "Tick before", Wish::TickBack);
-    _hold = GTK_BUTTON(addButton(to, "media-playback-pause-symbolic", "Hold", Wish::HoldOrPlay));
-    (void)addButton(to, "go-next-symbolic", "Next tick", Wish::TickForward);
-    (void)addButton(to, "media-skip-forward-symbolic", "Next event", Wish::EventForward);
-    (void)addButton(to, "go-last-symbolic", "To the present", Wish::ToPresent);
+    (void)addButton(to, "media-skip-backward-symbolic", translated("Event before"),
+                    Wish::EventBack);
+    (void)addButton(to, "go-previous-symbolic", translated("Tick before"), Wish::TickBack);
+    _hold = GTK_BUTTON(
+        addButton(to, "media-playback-pause-symbolic", translated("Hold"), Wish::HoldOrPlay));
+    (void)addButton(to, "go-next-symbolic", translated("Next tick"), Wish::TickForward);
+    (void)addButton(to, "media-skip-forward-symbolic", translated("Next event"),
+                    Wish::EventForward);
+    (void)addButton(to, "go-last-symbolic", translated("To the present"), Wish::ToPresent);
 }
 
 void TimeBar::buildPlace() {
     _place = GTK_ENTRY(gtk_entry_new());
-    gtk_entry_set_placeholder_text(_place, "14:03, +90s, or rsrp < -110");
-    nameWidget(GTK_WIDGET(_place), "Go to a time, or to where a condition becomes true");
+    gtk_entry_set_placeholder_text(_place, translated("14:03, +90s, or rsrp < -110"));
+    nameWidget(GTK_WIDGET(_place),
+               translated("Go to a time, or to where a condition becomes true"));
     onSignal(_place, "activate", _guard,
              [this] { _actions.goTo(gtk_editable_get_text(GTK_EDITABLE(_place))); });
     gtk_box_append(_box.get(), GTK_WIDGET(_place));
@@ -79,7 +84,7 @@ void TimeBar::show(const State& state) {
     const bool moves = state.isPlaying || state.words.empty();
     gtk_button_set_icon_name(_hold, moves ? "media-playback-pause-symbolic"
                                           : "media-playback-start-symbolic");
-    nameWidget(GTK_WIDGET(_hold), moves ? "Hold" : "Play");
+    nameWidget(GTK_WIDGET(_hold), moves ? translated("Hold") : translated("Play"));
     const std::string words = state.words.empty() ? state.clock : state.clock + ", " + state.words;
     gtk_label_set_text(_words, shownText(words).c_str());
 }

@@ -88,6 +88,20 @@ TEST_F(MainFrameTest, TheMenuRunsActionsOfTheWindow) {
     EXPECT_TRUE(isOn);
 }
 
+TEST_F(MainFrameTest, FitsAPhoneWithLargeTexts) {
+    GtkSettings* settings = gtk_settings_get_default();
+    gint usual = 0;
+    g_object_get(settings, "gtk-xft-dpi", &usual, nullptr);
+    constexpr int kTwice = 2 * 96 * 1024;
+    g_object_set(settings, "gtk-xft-dpi", kTwice, nullptr);
+    WindowStage stage(360, 720);
+    stage.tick(terminal::display());
+    stage.frame.setNote("End of the recording");
+    stage.select(0);
+    EXPECT_LE(gtk_widget_get_width(stage.window()), 360);
+    g_object_set(settings, "gtk-xft-dpi", usual, nullptr);
+}
+
 TEST_F(MainFrameTest, ClosingTheWindowAsksTheProgramToEnd) {
     WindowStage stage(360, 720);
     gtk_window_close(stage.frame.window());
