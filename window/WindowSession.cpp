@@ -2,6 +2,7 @@
 
 #include "timeline/Timeline.h"
 #include "ui/gtk/Translation.h"
+#include "window/ShownValue.h"
 
 #include <chrono>
 #include <utility>
@@ -30,9 +31,11 @@ WindowSession::WindowSession(Setup setup)
                                                    .child = setup.child,
                                                    .source = setup.request.options.source,
                                                    .face = face()}),
-      _instant(_viewer.travel(), _toolkit), _timeBar(setup.guard, timeActions()) {
+      _instant(_viewer.travel(), _toolkit), _timeBar(setup.guard, timeActions()),
+      _profile(setup.request.profile), _values(valueSource()) {
     gtk_widget_set_visible(_timeBar.widget(), FALSE);
     _viewer.attach(_toolkit);
+    _frame.onLeaf([this](const auto& path, const auto& text) { openValue(path, text); });
     _frame.setDetail(_overview.widget(), gtk::translated("Overview"));
     if (setup.request.settings.firstScreen == FirstScreen::Overview) {
         _frame.toggleDetail();
@@ -40,6 +43,7 @@ WindowSession::WindowSession(Setup setup)
 }
 
 WindowSession::~WindowSession() {
+    _frame.closePage();
     forgetInstant();
     _viewer.detach();
 }
@@ -58,7 +62,11 @@ ViewerSession::Face WindowSession::face() {
                 },
             .alarmBegan = [this](const AlarmRule& rule) { _notify(rule.name); },
             .timelineGrew = [this] { showTimeBar(); },
-            .timelineReplaced = [this] { forgetInstant(); },
+            .timelineReplaced =
+                [this] {
+                    forgetInstant();
+                    _values.forget();
+                },
             .mayGoOn = [](const auto& /*words*/) { return true; }};
 }
 
@@ -68,6 +76,32 @@ void WindowSession::tick() {
         _overview.show(_viewer.overview());
     }
     showTimeBar();
+    showValue();
+}
+
+terminal::ShownValues::Source WindowSession::valueSource() {
+    return {.moment = [this] { return _viewer.travel().moment(); },
+            .values = [this] { return _viewer.values(); },
+            .names = [this]() -> const NetworkNames& { return _viewer.names(); },
+            .time =
+                [this] {
+                    const Time time = _viewer.time();
+                    return terminal::DisplayTime{time, _viewer.zone(time).offset};
+                },
+            .profile = [this]() -> const QualityProfile& { return _profile; }};
+}
+
+void WindowSession::openValue(const std::string& path, const std::string& text) {
+    _valuePath = path;
+    _valueText = text;
+    _frame.openPage(_value.widget(), path.substr(path.rfind('/') + 1));
+    showValue();
+}
+
+void WindowSession::showValue() {
+    if (_frame.isPageOpen()) {
+        _value.show(shownValue(_values, _valuePath, _valueText));
+    }
 }
 
 gtk::TimeBar::Actions WindowSession::timeActions() {

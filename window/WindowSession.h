@@ -6,7 +6,9 @@
 #include "ui/gtk/MainFrame.h"
 #include "ui/gtk/OverviewView.h"
 #include "ui/gtk/TimeBar.h"
+#include "ui/gtk/ValueView.h"
 #include "ui/gtk/WidgetToolkit.h"
+#include "ui/pages/ShownValues.h"
 
 #include <functional>
 #include <memory>
@@ -50,7 +52,10 @@ public:
 
 private:
     ViewerSession::Face face();
+    terminal::ShownValues::Source valueSource();
     gtk::TimeBar::Actions timeActions();
+    void openValue(const std::string& path, const std::string& text);
+    void showValue();
     void travel(const std::function<Travel::Refusal(Travel&)>& action);
     void wish(gtk::TimeBar::Wish wish);
     void showInstant();
@@ -68,6 +73,11 @@ private:
     InstantPanes _instant;
     gtk::OverviewView _overview;
     gtk::TimeBar _timeBar;
+    const QualityProfile& _profile;
+    terminal::ShownValues _values;
+    gtk::ValueView _value;
+    std::string _valuePath;                   ///< of the value that its page shows
+    std::string _valueText;                   ///< of its row, when the page was opened
     std::unique_ptr<RepeatingTimer> _playing; ///< while time plays
 };
 

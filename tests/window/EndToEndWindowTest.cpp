@@ -75,6 +75,14 @@ TEST_F(EndToEndWindow, ARecordingIsOpenedAndWalkedThroughByKeys) {
                        "has 'Physical Cell ID: *' lacks Save"));
 }
 
+TEST_F(EndToEndWindow, AValueIsExplainedWithItsCurve) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' open 'Serving Cell Measurements' "
+                       "open 'Measured RSRP: *' has 'Reference signal received power*' "
+                       "has 'Curve: -100.25*' press Back lacks 'Curve: -100.25*' "
+                       "has 'Measured RSRP: *'"));
+}
+
 TEST_F(EndToEndWindow, ADemoRunsUntilItIsEnded) {
     expectDriven(drive("demo gsm --seed 7", "has 'Zorell_GSM · simulated gsm' "
                                             "has 'UMTS RR Info'"));

@@ -19,6 +19,7 @@ constexpr int kLeastWidth = 320;
 constexpr int kLeastHeight = 240;
 constexpr const char* kPanesPage = "panes";
 constexpr const char* kModalPage = "modal";
+constexpr const char* kOpenedPage = "opened";
 constexpr const char* kEndedPage = "ended";
 
 } // namespace
@@ -262,6 +263,32 @@ void MainFrame::modalChanged() {
     }
 }
 
+void MainFrame::openPage(GtkWidget* widget, const std::string& title) {
+    closePage();
+    GtkWidget* header = adw_header_bar_new();
+    GtkWidget* backButton = gtk_button_new_from_icon_name("go-previous-symbolic");
+    nameWidget(backButton, translated("Back"));
+    onSignal(backButton, "clicked", _guard, [this] { closePage(); });
+    adw_header_bar_pack_start(ADW_HEADER_BAR(header), backButton);
+    adw_header_bar_set_title_widget(ADW_HEADER_BAR(header),
+                                    adw_window_title_new(shownText(title).c_str(), ""));
+    _page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
+    gtk_box_append(GTK_BOX(_page), header);
+    gtk_box_append(GTK_BOX(_page), widget);
+    gtk_stack_add_named(_pages, _page, kOpenedPage);
+    gtk_stack_set_visible_child_name(_pages, kOpenedPage);
+    gtk_widget_grab_focus(backButton);
+}
+
+/// The widget belongs to whoever gave it, and may come back.
+void MainFrame::closePage() {
+    if (_page != nullptr) {
+        gtk_box_remove(GTK_BOX(_page), gtk_widget_get_last_child(_page));
+        gtk_stack_set_visible_child_name(_pages, kPanesPage);
+        gtk_stack_remove(_pages, std::exchange(_page, nullptr));
+    }
+}
+
 void MainFrame::present() {
     gtk_window_present(window());
 }
@@ -343,7 +370,9 @@ void MainFrame::showEnded(const std::string& sentence) {
 }
 
 void MainFrame::back() {
-    if (_stack != nullptr && _stack->modal() != nullptr) {
+    if (_page != nullptr) {
+        closePage();
+    } else if (_stack != nullptr && _stack->modal() != nullptr) {
         _stack->modal()->cancelPressed();
     } else if (_stack != nullptr) {
         _stack->back();

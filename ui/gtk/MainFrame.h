@@ -71,6 +71,15 @@ public:
         _key = std::move(action);
     }
     void toggleSearch();
+    /// A row with a value was selected.
+    void onLeaf(std::function<void(const std::string& path, const std::string& text)> action) {
+        _leaf = std::move(action);
+    }
+    void leafSelected(const std::string& path, const std::string& text) { _leaf(path, text); }
+    /// A page over the panes, until the user goes back.
+    void openPage(GtkWidget* widget, const std::string& title);
+    bool isPageOpen() const { return _page != nullptr; }
+    void closePage();
 
 private:
     void build();
@@ -108,6 +117,9 @@ private:
     GtkLabel* _remarks;
     GtkButton* _save;
     GtkWidget* _modal = nullptr;
+    GtkWidget* _page = nullptr;
+    std::function<void(const std::string&, const std::string&)> _leaf =
+        [](const std::string& /*path*/, const std::string& /*text*/) {};
     Ref<GtkWidget> _detail; ///< beside the root pane
     std::string _detailTitle;
     std::function<void()> _saveAction = [] {};

@@ -85,6 +85,7 @@ void WidgetNavigation::add(ui::TableScreen& screen, AdwLeaflet* to) {
             popTo(static_cast<std::size_t>(found - _screens.begin()), false);
         }
     });
+    table.onLeaf(_frame.leafSelected);
     gtk_widget_set_size_request(table.widget(), kListWidth, -1);
     _isShowing = true; // the first page of an empty leaflet is shown at once
     adw_leaflet_append(to, table.widget());

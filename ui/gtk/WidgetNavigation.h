@@ -20,6 +20,7 @@ public:
     struct Frame {
         std::function<void()> changed; ///< the topmost pane is another one
         std::function<void()> toolbarShown;
+        std::function<void(const std::string& path, const std::string& text)> leafSelected;
         std::function<void()> modalChanged; ///< a modal screen was presented or dismissed
     };
 
