@@ -2,10 +2,16 @@
 
 #include "browsing/SourceShow.h"
 #include "browsing/ViewerSession.h"
+#include "travel/InstantPanes.h"
 #include "ui/gtk/MainFrame.h"
+#include "ui/gtk/OverviewView.h"
+#include "ui/gtk/TimeBar.h"
+#include "ui/gtk/ValueView.h"
 #include "ui/gtk/WidgetToolkit.h"
+#include "ui/pages/ShownValues.h"
 
 #include <functional>
+#include <memory>
 #include <string>
 
 namespace pallax {
@@ -22,22 +28,57 @@ public:
         const ShowRequest& request;
         SocketDirectory directory;
         ChildService* child; ///< null for a service of this machine
+        /// Tells of an alarm outside the window.
+        std::function<void(const std::string& name)> notify;
     };
 
     explicit WindowSession(Setup setup);
-    ~WindowSession() { _viewer.detach(); }
+    ~WindowSession();
     WindowSession(const WindowSession&) = delete;
     WindowSession& operator=(const WindowSession&) = delete;
 
     void start() { _viewer.start(); }
     bool hasLostSource() const { return _viewer.hasLostSource(); }
 
+    gtk::OverviewView& overview() { return _overview; }
+    gtk::TimeBar& timeBar() { return _timeBar; }
+    /// Shows the time bar, or no longer, and then the present.
+    void toggleTimeBar();
+    void startAfresh() { _viewer.startAfresh(); }
+    bool isSafe() const { return _isSafe; }
+    void toggleSafe();
+    /// A key that nothing else takes; false if it means nothing here.
+    bool handleKey(guint key);
+
 private:
     ViewerSession::Face face();
+    terminal::ShownValues::Source valueSource();
+    gtk::TimeBar::Actions timeActions();
+    void openValue(const std::string& path, const std::string& text);
+    void showValue();
+    void travel(const std::function<Travel::Refusal(Travel&)>& action);
+    void wish(gtk::TimeBar::Wish wish);
+    void showInstant();
+    void showTimeBar();
+    void forgetInstant();
+    void tick();
 
+    AsioMainQueue& _queue;
     gtk::MainFrame& _frame;
+    std::function<void(const std::string& name)> _notify;
+    bool _staysSafe; ///< it was started so
+    bool _isSafe;
     gtk::WidgetToolkit _toolkit;
     ViewerSession _viewer;
+    InstantPanes _instant;
+    gtk::OverviewView _overview;
+    gtk::TimeBar _timeBar;
+    const QualityProfile& _profile;
+    terminal::ShownValues _values;
+    gtk::ValueView _value;
+    std::string _valuePath;                   ///< of the value that its page shows
+    std::string _valueText;                   ///< of its row, when the page was opened
+    std::unique_ptr<RepeatingTimer> _playing; ///< while time plays
 };
 
 } // namespace pallax

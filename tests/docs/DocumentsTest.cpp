@@ -28,8 +28,8 @@ using doubles::shownCommands;
 
 /// Beginnings of commands that are not run: they build, install, or need more than a test has.
 constexpr auto kNotRun = std::to_array<std::string_view>({
-    "./run", "./test", "cmake ", "cpack ", "systemctl ", "build/dev/reference/make_reference",
-    "build/dev/tests/",
+    "./run", "./test", "pallax-window", "cmake ", "cpack ", "systemctl ",
+    "build/dev/reference/make_reference", "build/dev/tests/",
     "pallax modem", // they need one
     "pallax service --modem", "pallax record --modem",
     "ssh -L ", // it needs a port that may be taken

@@ -146,7 +146,7 @@ const std::vector<Layer>& layers() {
                  "watching", "browsing",   "recording", "web"}},
         {"window",
          {"text", "platform", "platform/ui", "host", "timeline", "overview", "travel", "sources",
-          "telephony", "link", "console", "decoding", "browsing", "cli", "ui/gtk"}},
+          "telephony", "link", "console", "decoding", "browsing", "cli", "ui/gtk", "ui/pages"}},
         {"tests/doubles",
          {"text", "plist", "platform", "packets", "platform/ui", records, generators, "monitor",
           "host"}},

@@ -64,6 +64,9 @@ TEST_F(Installation, EveryManualPageAndCompletionIsThere) {
     std::set<std::string> pages{"man5/pallax.conf.5", "man7/pallax-privacy.7",
                                 "man7/pallax-recording.7", "man7/pallax-sections.7",
                                 "man7/pallax-sql.7"};
+#ifdef PALLAX_HAS_WINDOW
+    pages.insert("man1/pallax-window.1");
+#endif
     const CommandDescription program = CommandLine().description();
     for (const std::string& name : manualPages(program)) {
         pages.insert("man1/" + name + ".1");

@@ -75,9 +75,35 @@ TEST_F(EndToEndWindow, ARecordingIsOpenedAndWalkedThroughByKeys) {
                        "has 'Physical Cell ID: *' lacks Save"));
 }
 
+TEST_F(EndToEndWindow, AValueIsExplainedWithItsCurve) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' open 'Serving Cell Measurements' "
+                       "open 'Measured RSRP: *' has 'Reference signal received power*' "
+                       "has 'Curve: -100.25*' press Back lacks 'Curve: -100.25*' "
+                       "has 'Measured RSRP: *'"));
+}
+
 TEST_F(EndToEndWindow, ADemoRunsUntilItIsEnded) {
     expectDriven(drive("demo gsm --seed 7", "has 'Zorell_GSM · simulated gsm' "
                                             "has 'UMTS RR Info'"));
+}
+
+TEST_F(EndToEndWindow, TimeIsHeldSteppedAndReleased) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key space "
+                       "has Play press 'Event before' has '22:15:19, held*' "
+                       "press 'Event before' has '22:15:18, held*' "
+                       "press 'To the present' lacks '22:15:18, held*' has Hold"));
+}
+
+TEST_F(EndToEndWindow, SpeaksGermanButKeepsTheModemsTexts) {
+    if (!std::filesystem::exists(PALLAX_BINARY_DIR "/locale")) {
+        GTEST_SKIP() << "gettext is not installed";
+    }
+    world.environment.insert(world.environment.end(), {"LANG=C.UTF-8", "LANGUAGE=de"});
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Menü' has 'Netzbetreiber' has 'Serving Cell Info' "
+                       "has 'Updated 2023-11-14 at 22:15:20'"));
 }
 
 TEST_F(EndToEndWindow, ClosingTheWindowEndsTheProgram) {
@@ -86,9 +112,10 @@ TEST_F(EndToEndWindow, ClosingTheWindowEndsTheProgram) {
 
 TEST_F(EndToEndWindow, ASnapshotIsSaved) {
     const std::string folder = offerSaving(world.path("marker"));
-    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
-                       "has 'SIM Info' press Save has 'DLF binary*' type 'tunnel entrance' "
-                       "press Save lacks 'DLF binary*' has 'Saved *'"));
+    expectDriven(
+        drive(sample("lte-drive.pcap") + " --speed max",
+              "has 'SIM Info' press Save has 'DLF binary*' type 'Description=tunnel entrance' "
+              "press Save lacks 'DLF binary*' has 'Saved *'"));
     std::string content;
     for (const auto& entry : std::filesystem::directory_iterator(folder)) {
         std::ifstream file(entry.path());

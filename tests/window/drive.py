@@ -7,7 +7,7 @@
   open NAME        goes to the row with this name by keys, and presses Enter
   focus NAME       goes to it
   key KEY          presses a key: Escape, Right
-  type TEXT        puts the text into the field
+  type NAME=TEXT   puts the text into the field with this name
   tree             prints all names
 
 A NAME that ends in * is the beginning of one. Prints what failed and ends with status 1.
@@ -21,7 +21,7 @@ gi.require_version("Atspi", "2.0")
 from gi.repository import Atspi  # noqa: E402
 
 PATIENCE = 20  # seconds
-KEYS = {"Tab": 0xFF09, "Up": 0xFF52, "Return": 0xFF0D, "Escape": 0xFF1B, "Right": 0xFF53, "Left": 0xFF51, "Down": 0xFF54}
+KEYS = {"space": 0x20, "Tab": 0xFF09, "Up": 0xFF52, "Return": 0xFF0D, "Escape": 0xFF1B, "Right": 0xFF53, "Left": 0xFF51, "Down": 0xFF54}
 
 
 def children(node):
@@ -115,13 +115,12 @@ def walk_to(item):
     sys.exit("cannot go to the row\n" + tree())
 
 
-def field():
+def field(name):
     for window in windows():
         for node in walk(window):
-            if node.get_role() in (Atspi.Role.TEXT, Atspi.Role.ENTRY) and is_shown(node):
-                editable = node.get_editable_text_iface()
-                if editable is not None:
-                    return editable
+            if node.get_role() in (Atspi.Role.TEXT, Atspi.Role.ENTRY) and node.get_name() == name:
+                if node.get_editable_text_iface() is not None:
+                    return node
     return None
 
 
@@ -142,7 +141,9 @@ def step(verb, argument):
     elif verb == "key":
         press_key(argument)
     elif verb == "type":
-        await_result(field, "no field").set_text_contents(argument)
+        name, text = argument.split("=", 1)
+        node = await_result(lambda: field(name), "no field " + name)
+        node.get_editable_text_iface().set_text_contents(text)
     else:
         sys.exit("unknown step " + verb)
 

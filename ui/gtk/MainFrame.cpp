@@ -3,6 +3,8 @@
 #include "ui/gtk/SaveScreen.h"
 #include "ui/gtk/ShownText.h"
 #include "ui/gtk/Style.h"
+#include "ui/gtk/Translation.h"
+#include "ui/gtk/WidgetTable.h"
 
 #include <utility>
 #include <variant>
@@ -11,19 +13,14 @@ namespace pallax::gtk {
 
 namespace {
 
-constexpr int kUsualWidth = 720;
-constexpr int kUsualHeight = 640;
+constexpr int kUsualWidth = 1000;
+constexpr int kUsualHeight = 700;
 constexpr int kLeastWidth = 320;
 constexpr int kLeastHeight = 240;
 constexpr const char* kPanesPage = "panes";
 constexpr const char* kModalPage = "modal";
+constexpr const char* kOpenedPage = "opened";
 constexpr const char* kEndedPage = "ended";
-
-/// A name for screen readers, and a tooltip.
-void name(GtkWidget* widget, const char* text) {
-    gtk_widget_set_tooltip_text(widget, text);
-    gtk_accessible_update_property(GTK_ACCESSIBLE(widget), GTK_ACCESSIBLE_PROPERTY_LABEL, text, -1);
-}
 
 } // namespace
 
@@ -36,10 +33,13 @@ MainFrame::MainFrame(GtkApplication* application, const Guard& guard, Actions ac
       _title(ADW_WINDOW_TITLE(adw_window_title_new("Pallax", ""))),
       _back(GTK_BUTTON(gtk_button_new_from_icon_name("go-previous-symbolic"))),
       _oldValues(GTK_LABEL(gtk_label_new(nullptr))), _panes(ADW_BIN(adw_bin_new())),
+      _searchBar(GTK_SEARCH_BAR(gtk_search_bar_new())),
+      _search(GTK_SEARCH_ENTRY(gtk_search_entry_new())),
+      _bars(GTK_BOX(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0))),
       _toolbar(GTK_BOX(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 8))),
       _spinner(GTK_SPINNER(gtk_spinner_new())), _status(GTK_LABEL(gtk_label_new(nullptr))),
       _remarks(GTK_LABEL(gtk_label_new(nullptr))),
-      _save(GTK_BUTTON(gtk_button_new_with_label("Save"))) {
+      _save(GTK_BUTTON(gtk_button_new_with_label(translated("Save")))) {
     addStyle();
     build();
     listen();
@@ -56,7 +56,7 @@ void MainFrame::build() {
     gtk_window_set_title(window(), "Pallax");
     gtk_window_set_default_size(window(), kUsualWidth, kUsualHeight);
     gtk_widget_set_size_request(_window.get(), kLeastWidth, kLeastHeight);
-    name(GTK_WIDGET(_back), "Back");
+    nameWidget(GTK_WIDGET(_back), translated("Back"));
     gtk_widget_set_visible(GTK_WIDGET(_back), FALSE);
     adw_header_bar_pack_start(_header, GTK_WIDGET(_back));
     adw_header_bar_set_title_widget(_header, GTK_WIDGET(_title));
@@ -66,8 +66,9 @@ void MainFrame::build() {
     gtk_widget_set_vexpand(GTK_WIDGET(_panes), TRUE);
 
     GtkWidget* page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
-    for (GtkWidget* child :
-         {GTK_WIDGET(_header), GTK_WIDGET(_oldValues), GTK_WIDGET(_panes), buildToolbar()}) {
+    buildSearch();
+    for (GtkWidget* child : {GTK_WIDGET(_header), GTK_WIDGET(_searchBar), GTK_WIDGET(_oldValues),
+                             GTK_WIDGET(_panes), GTK_WIDGET(_bars), buildToolbar()}) {
         gtk_box_append(GTK_BOX(page), child);
     }
     gtk_stack_add_named(_pages, page, kPanesPage);
@@ -83,13 +84,21 @@ GtkWidget* MainFrame::buildToolbar() {
     gtk_widget_set_visible(toolbar, FALSE);
     gtk_widget_set_visible(GTK_WIDGET(_spinner), FALSE);
     gtk_widget_set_visible(GTK_WIDGET(_save), FALSE);
-    name(GTK_WIDGET(_spinner), "Connecting");
-    gtk_widget_add_css_class(GTK_WIDGET(_remarks), "dim-label");
-    gtk_label_set_ellipsize(_remarks, PANGO_ELLIPSIZE_END);
-    gtk_label_set_xalign(_remarks, 0);
-    gtk_widget_set_hexpand(GTK_WIDGET(_remarks), TRUE);
-    for (GtkWidget* child :
-         {GTK_WIDGET(_spinner), GTK_WIDGET(_status), GTK_WIDGET(_remarks), GTK_WIDGET(_save)}) {
+    gtk_widget_set_valign(GTK_WIDGET(_save), GTK_ALIGN_CENTER);
+    nameWidget(GTK_WIDGET(_spinner), translated("Connecting"));
+    GtkWidget* texts = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
+    gtk_widget_set_hexpand(texts, TRUE);
+    gtk_widget_set_valign(texts, GTK_ALIGN_CENTER);
+    for (GtkLabel* label : {_status, _remarks}) {
+        gtk_label_set_ellipsize(label, PANGO_ELLIPSIZE_END);
+        gtk_label_set_xalign(label, 0);
+        gtk_box_append(GTK_BOX(texts), GTK_WIDGET(label));
+    }
+    for (const char* look : {"dim-label", "caption"}) {
+        gtk_widget_add_css_class(GTK_WIDGET(_remarks), look);
+    }
+    showText(_remarks, "");
+    for (GtkWidget* child : {GTK_WIDGET(_spinner), texts, GTK_WIDGET(_save)}) {
         gtk_box_append(_toolbar, child);
     }
     return toolbar;
@@ -103,6 +112,7 @@ void MainFrame::listen() {
                 return TRUE; // the window goes with the program
             }));
     GtkEventController* keys = gtk_event_controller_key_new();
+    gtk_event_controller_set_propagation_phase(keys, GTK_PHASE_CAPTURE);
     connect(keys, "key-pressed", _guard,
             std::function<gboolean(guint, guint, GdkModifierType)>(
                 [this](guint key, guint code, GdkModifierType state) {
@@ -132,6 +142,21 @@ ui::Rect MainFrame::bounds() const {
 }
 
 void MainFrame::setStack(WidgetNavigation* stack) {
+    _live = stack;
+    adopt(stack);
+}
+
+void MainFrame::setHeldStack(WidgetNavigation* stack) {
+    WidgetNavigation* wanted = stack != nullptr ? stack : _live;
+    if (wanted != _stack) {
+        adopt(wanted);
+    }
+}
+
+void MainFrame::adopt(WidgetNavigation* stack) {
+    if (_stack != nullptr) {
+        _stack->setDetail(nullptr); // it goes to the next one
+    }
     _stack = stack;
     modalChanged();
     adw_bin_set_child(_panes, stack != nullptr ? stack->widget() : nullptr);
@@ -141,11 +166,49 @@ void MainFrame::setStack(WidgetNavigation* stack) {
     refresh();
 }
 
-void MainFrame::setDetail(GtkWidget* widget) {
+void MainFrame::setDetail(GtkWidget* widget, std::string title) {
     _detail = shared(widget);
+    _detailTitle = std::move(title);
     if (_stack != nullptr) {
         _stack->setDetail(widget);
     }
+}
+
+void MainFrame::toggleDetail() {
+    if (_stack != nullptr) {
+        _stack->showDetail(!_stack->isDetailOnTop());
+        refresh();
+    }
+}
+
+void MainFrame::addBar(GtkWidget* bar) {
+    gtk_box_append(_bars, bar);
+}
+
+void MainFrame::buildSearch() {
+    gtk_search_bar_set_child(_searchBar, GTK_WIDGET(_search));
+    gtk_search_bar_connect_entry(_searchBar, GTK_EDITABLE(_search));
+    gtk_widget_set_hexpand(GTK_WIDGET(_search), TRUE);
+    nameWidget(GTK_WIDGET(_search), translated("Show rows that contain a text"));
+    onSignal(_search, "search-changed", _guard, [this] { filter(); });
+    onSignal(_searchBar, "notify::search-mode-enabled", _guard, [this] {
+        if (gtk_search_bar_get_search_mode(_searchBar) == FALSE) {
+            gtk_editable_set_text(GTK_EDITABLE(_search), "");
+            filter();
+        }
+    });
+}
+
+/// Filters the topmost pane.
+void MainFrame::filter() {
+    if (_stack != nullptr) {
+        widgetTable(_stack->top().table()).setFilter(gtk_editable_get_text(GTK_EDITABLE(_search)));
+    }
+}
+
+void MainFrame::toggleSearch() {
+    const bool isOpen = gtk_search_bar_get_search_mode(_searchBar) != FALSE;
+    gtk_search_bar_set_search_mode(_searchBar, isOpen ? FALSE : TRUE);
 }
 
 void MainFrame::setMenu(GtkWidget* button) {
@@ -156,9 +219,13 @@ void MainFrame::refresh() {
     if (_stack == nullptr) {
         return;
     }
-    adw_window_title_set_title(_title, shownText(_stack->top().title()).c_str());
-    gtk_widget_set_visible(GTK_WIDGET(_back), _stack->isAtRoot() ? FALSE : TRUE);
-    gtk_widget_set_visible(GTK_WIDGET(_toolbar), _stack->isToolbarShown() ? TRUE : FALSE);
+    const bool isDetail = _stack->isDetailOnTop() && !_stack->isSideBySide();
+    adw_window_title_set_title(_title,
+                               shownText(isDetail ? _detailTitle : _stack->top().title()).c_str());
+    gtk_widget_set_visible(GTK_WIDGET(_back), _stack->isAtRoot() && !isDetail ? FALSE : TRUE);
+    // The panes of another instant have no connection to tell of.
+    const bool hasToolbar = _stack == _live && _stack->isToolbarShown();
+    gtk_widget_set_visible(GTK_WIDGET(_toolbar), hasToolbar ? TRUE : FALSE);
     showToolbarItems(_stack->top().toolbarItems());
 }
 
@@ -196,6 +263,32 @@ void MainFrame::modalChanged() {
     }
 }
 
+void MainFrame::openPage(GtkWidget* widget, const std::string& title) {
+    closePage();
+    GtkWidget* header = adw_header_bar_new();
+    GtkWidget* backButton = gtk_button_new_from_icon_name("go-previous-symbolic");
+    nameWidget(backButton, translated("Back"));
+    onSignal(backButton, "clicked", _guard, [this] { closePage(); });
+    adw_header_bar_pack_start(ADW_HEADER_BAR(header), backButton);
+    adw_header_bar_set_title_widget(ADW_HEADER_BAR(header),
+                                    adw_window_title_new(shownText(title).c_str(), ""));
+    _page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
+    gtk_box_append(GTK_BOX(_page), header);
+    gtk_box_append(GTK_BOX(_page), widget);
+    gtk_stack_add_named(_pages, _page, kOpenedPage);
+    gtk_stack_set_visible_child_name(_pages, kOpenedPage);
+    gtk_widget_grab_focus(backButton);
+}
+
+/// The widget belongs to whoever gave it, and may come back.
+void MainFrame::closePage() {
+    if (_page != nullptr) {
+        gtk_box_remove(GTK_BOX(_page), gtk_widget_get_last_child(_page));
+        gtk_stack_set_visible_child_name(_pages, kPanesPage);
+        gtk_stack_remove(_pages, std::exchange(_page, nullptr));
+    }
+}
+
 void MainFrame::present() {
     gtk_window_present(window());
 }
@@ -230,7 +323,7 @@ void MainFrame::setStream(std::string state) {
 void MainFrame::setAlarms(const std::vector<std::string>& names) {
     _alarms.clear();
     for (const std::string& alarm : names) {
-        _alarms += (_alarms.empty() ? "alarm: " : ", ") + alarm;
+        _alarms += (_alarms.empty() ? translated("alarm: ") : ", ") + alarm;
     }
     showRemarks();
 }
@@ -242,7 +335,7 @@ void MainFrame::showRemarks() {
             text += (text.empty() ? "" : " · ") + *part;
         }
     }
-    gtk_label_set_text(_remarks, shownText(text).c_str());
+    showText(_remarks, text);
     gtk_widget_set_tooltip_text(GTK_WIDGET(_remarks),
                                 text.empty() ? nullptr : shownText(text).c_str());
 }
@@ -253,7 +346,8 @@ void MainFrame::setOrigin(const std::string& technology, const std::string& sour
 }
 
 void MainFrame::setOldValues(const std::string& time) {
-    showText(_oldValues, time.empty() ? "" : "The link was restarted: values from before " + time);
+    showText(_oldValues,
+             time.empty() ? "" : translated("The link was restarted: values from before ") + time);
 }
 
 void MainFrame::showEnded(const std::string& sentence) {
@@ -261,9 +355,9 @@ void MainFrame::showEnded(const std::string& sentence) {
     gtk_box_append(GTK_BOX(page), adw_header_bar_new());
     GtkWidget* status = adw_status_page_new();
     adw_status_page_set_icon_name(ADW_STATUS_PAGE(status), "dialog-error-symbolic");
-    adw_status_page_set_title(ADW_STATUS_PAGE(status), "Pallax has stopped");
+    adw_status_page_set_title(ADW_STATUS_PAGE(status), translated("Pallax has stopped"));
     adw_status_page_set_description(ADW_STATUS_PAGE(status), shownMarkup(sentence).c_str());
-    GtkWidget* close = gtk_button_new_with_label("Close");
+    GtkWidget* close = gtk_button_new_with_label(translated("Close"));
     gtk_widget_add_css_class(close, "pill");
     gtk_widget_set_halign(close, GTK_ALIGN_CENTER);
     onSignal(close, "clicked", _guard, [this] { _guard.queue().async(_actions.closed); });
@@ -276,20 +370,34 @@ void MainFrame::showEnded(const std::string& sentence) {
 }
 
 void MainFrame::back() {
-    if (_stack != nullptr && _stack->modal() != nullptr) {
+    if (_page != nullptr) {
+        closePage();
+    } else if (_stack != nullptr && _stack->modal() != nullptr) {
         _stack->modal()->cancelPressed();
     } else if (_stack != nullptr) {
         _stack->back();
     }
 }
 
+/// Comes before the widget with the focus, because rows of a list take the space bar. A widget that
+/// needs a key itself gets it: letters go to a field, the space bar presses a button.
 gboolean MainFrame::handleKey(guint key, guint /*code*/, GdkModifierType state) {
     const bool isAlt = (state & GDK_ALT_MASK) != 0;
-    if (key == GDK_KEY_Escape || key == GDK_KEY_Back || (isAlt && key == GDK_KEY_Left)) {
+    const bool isControl = (state & GDK_CONTROL_MASK) != 0;
+    GtkWidget* focus = gtk_window_get_focus(window());
+    const bool isTyping = focus != nullptr && GTK_IS_EDITABLE(focus) != FALSE;
+    const bool isPressed =
+        focus != nullptr && (GTK_IS_BUTTON(focus) || GTK_IS_TOGGLE_BUTTON(focus));
+    if (key == GDK_KEY_Back || (isAlt && key == GDK_KEY_Left) ||
+        (key == GDK_KEY_Escape && !isTyping)) {
         back();
         return TRUE;
     }
-    return FALSE;
+    if ((isTyping && !isControl) || (isPressed && key == GDK_KEY_space) ||
+        (_stack != nullptr && _stack->modal() != nullptr)) {
+        return FALSE;
+    }
+    return _key(key, state) ? TRUE : FALSE;
 }
 
 } // namespace pallax::gtk

@@ -56,12 +56,38 @@ public:
 
     /// At the right of the title bar.
     void setMenu(GtkWidget* button);
-    void setDetail(GtkWidget* widget);
+    /// What stands beside the root pane while no other is open, or on its own.
+    void setDetail(GtkWidget* widget, std::string title);
+    /// On a screen with room for one pane, the detail is shown over the root pane, or no longer.
+    void toggleDetail();
+    /// The panes of another instant, in place of the live ones; null: the live ones.
+    void setHeldStack(WidgetNavigation* stack);
+    /// The panes whose application lives.
+    WidgetNavigation* liveStack() const { return _live; }
+    /// Below the panes.
+    void addBar(GtkWidget* bar);
+    /// Keys that go to the frame when nothing else takes them; true: taken.
+    void onKey(std::function<bool(guint key, GdkModifierType state)> action) {
+        _key = std::move(action);
+    }
+    void toggleSearch();
+    /// A row with a value was selected.
+    void onLeaf(std::function<void(const std::string& path, const std::string& text)> action) {
+        _leaf = std::move(action);
+    }
+    void leafSelected(const std::string& path, const std::string& text) { _leaf(path, text); }
+    /// A page over the panes, until the user goes back.
+    void openPage(GtkWidget* widget, const std::string& title);
+    bool isPageOpen() const { return _page != nullptr; }
+    void closePage();
 
 private:
     void build();
     void listen();
     GtkWidget* buildToolbar();
+    void adopt(WidgetNavigation* stack);
+    void buildSearch();
+    void filter();
     void showToolbarItems(const ui::BarItems& items);
     void showRemarks();
     void back();
@@ -71,7 +97,9 @@ private:
     Actions _actions;
     Ref<GtkWidget> _window;
     PangoMetrics _metrics;
-    WidgetNavigation* _stack = nullptr;
+    WidgetNavigation* _stack = nullptr; ///< that is shown: the live one, or that of an instant
+    WidgetNavigation* _live = nullptr;
+    std::function<bool(guint, GdkModifierType)> _key = [](guint, GdkModifierType) { return false; };
     // The window owns what follows.
     AdwToastOverlay* _toasts;
     GtkStack* _pages;
@@ -80,13 +108,20 @@ private:
     GtkButton* _back;
     GtkLabel* _oldValues;
     AdwBin* _panes;
+    GtkSearchBar* _searchBar;
+    GtkSearchEntry* _search;
+    GtkBox* _bars; ///< below the panes
     GtkBox* _toolbar;
     GtkSpinner* _spinner;
     GtkLabel* _status;
     GtkLabel* _remarks;
     GtkButton* _save;
     GtkWidget* _modal = nullptr;
+    GtkWidget* _page = nullptr;
+    std::function<void(const std::string&, const std::string&)> _leaf =
+        [](const std::string& /*path*/, const std::string& /*text*/) {};
     Ref<GtkWidget> _detail; ///< beside the root pane
+    std::string _detailTitle;
     std::function<void()> _saveAction = [] {};
     std::string _note;
     std::string _stream;

@@ -1,6 +1,7 @@
 #include "ui/gtk/RowView.h"
 
 #include "ui/gtk/ShownText.h"
+#include "ui/gtk/Translation.h"
 
 #include <algorithm>
 #include <cmath>
@@ -40,10 +41,10 @@ std::string spokenName(const ui::CellContents& contents, const RowNotes& notes) 
         name += ", " + notes.count;
     }
     if (notes.hasChanged) {
-        name += ", changed";
+        name += translated(", changed");
     }
     if (!notes.age.empty()) {
-        name += ", " + notes.age + " old";
+        name += ", " + notes.age + translated(" old");
     }
     return name;
 }
@@ -74,22 +75,28 @@ RowView::RowView(const PangoMetrics& metrics, const Guard& guard,
     gtk_widget_set_hexpand(scroller, TRUE);
     gtk_widget_set_can_focus(scroller, FALSE);
     gtk_box_append(_box.get(), scroller);
-    GtkWidget* side = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, kAccessoryMargin);
-    gtk_widget_set_hexpand(side, FALSE); // the room is the content's
-    _side = GTK_BOX(side);
-    gtk_box_append(_box.get(), side);
-    _count = dimLabel();
-    gtk_widget_set_hexpand(GTK_WIDGET(_count), TRUE);
-    gtk_label_set_xalign(_count, 1);
-    gtk_box_append(_side, GTK_WIDGET(_count));
-    _accessory = GTK_IMAGE(gtk_image_new());
-    gtk_widget_add_css_class(GTK_WIDGET(_accessory), "dim-label");
-    gtk_widget_set_margin_end(GTK_WIDGET(_accessory), kAccessoryMargin);
-    gtk_box_append(_side, GTK_WIDGET(_accessory));
+    buildSide();
     _age = dimLabel();
     gtk_fixed_put(_content, GTK_WIDGET(_age), 0, 0);
     replaceWheel(scroller);
     listen(guard, std::move(scrolled));
+}
+
+void RowView::buildSide() {
+    GtkWidget* side = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 0);
+    gtk_widget_set_hexpand(side, FALSE); // the room is the content's
+    _side = GTK_BOX(side);
+    gtk_box_append(_box.get(), side);
+    GtkWidget* marks = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, kAccessoryMargin);
+    gtk_widget_set_hexpand(marks, TRUE);
+    gtk_widget_set_halign(marks, GTK_ALIGN_END);
+    gtk_box_append(_side, marks);
+    _count = dimLabel();
+    gtk_box_append(GTK_BOX(marks), GTK_WIDGET(_count));
+    _accessory = GTK_IMAGE(gtk_image_new());
+    gtk_widget_add_css_class(GTK_WIDGET(_accessory), "dim-label");
+    gtk_widget_set_margin_end(GTK_WIDGET(_accessory), kAccessoryMargin);
+    gtk_box_append(GTK_BOX(marks), GTK_WIDGET(_accessory));
 }
 
 RowView::~RowView() {

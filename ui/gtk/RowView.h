@@ -44,6 +44,7 @@ public:
     bool scrollBy(double distance);
 
 private:
+    void buildSide();
     GtkLabel* labelAt(std::size_t index);
     /// `area` is that of a cell that does not scroll.
     void place(GtkLabel* label, const ui::Label& content, const ui::Rect& area, bool isBold);

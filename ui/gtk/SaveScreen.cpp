@@ -1,5 +1,6 @@
 #include "ui/gtk/SaveScreen.h"
 
+#include "ui/gtk/Translation.h"
 #include "ui/gtk/WidgetTable.h"
 
 #include <adwaita.h>
@@ -16,11 +17,11 @@ GtkWidget* buildHeader(ui::ModalScreen& screen, const Guard& guard) {
     adw_header_bar_set_show_start_title_buttons(ADW_HEADER_BAR(header), FALSE);
     adw_header_bar_set_show_end_title_buttons(ADW_HEADER_BAR(header), FALSE);
     adw_header_bar_set_title_widget(ADW_HEADER_BAR(header),
-                                    adw_window_title_new("Save snapshot", ""));
-    GtkWidget* cancel = gtk_button_new_with_label("Cancel");
+                                    adw_window_title_new(translated("Save snapshot"), ""));
+    GtkWidget* cancel = gtk_button_new_with_label(translated("Cancel"));
     onSignal(cancel, "clicked", guard, [&screen] { screen.cancelPressed(); });
     adw_header_bar_pack_start(ADW_HEADER_BAR(header), cancel);
-    GtkWidget* save = gtk_button_new_with_label("Save");
+    GtkWidget* save = gtk_button_new_with_label(translated("Save"));
     gtk_widget_add_css_class(save, "suggested-action");
     onSignal(save, "clicked", guard, [&screen] { screen.savePressed(); });
     adw_header_bar_pack_end(ADW_HEADER_BAR(header), save);
@@ -47,7 +48,7 @@ GtkWidget* saveScreen(ui::ModalScreen& screen, const Guard& guard) {
     gtk_widget_set_vexpand(list, FALSE);
     gtk_box_append(GTK_BOX(content), list);
     GtkWidget* field = widgetTextField(screen.field()).widget();
-    GtkWidget* label = gtk_label_new("Description");
+    GtkWidget* label = gtk_label_new(translated("Description"));
     gtk_label_set_xalign(GTK_LABEL(label), 0);
     gtk_accessible_update_relation(GTK_ACCESSIBLE(field), GTK_ACCESSIBLE_RELATION_LABELLED_BY,
                                    label, nullptr, -1);

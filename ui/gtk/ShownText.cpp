@@ -21,4 +21,9 @@ void showText(GtkLabel* label, std::string_view text) {
     gtk_widget_set_visible(GTK_WIDGET(label), text.empty() ? FALSE : TRUE);
 }
 
+void nameWidget(GtkWidget* widget, const char* name) {
+    gtk_widget_set_tooltip_text(widget, name);
+    gtk_accessible_update_property(GTK_ACCESSIBLE(widget), GTK_ACCESSIBLE_PROPERTY_LABEL, name, -1);
+}
+
 } // namespace pallax::gtk

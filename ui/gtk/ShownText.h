@@ -15,4 +15,7 @@ std::string shownMarkup(std::string_view text);
 /// Shows the text; a label without one is not seen.
 void showText(GtkLabel* label, std::string_view text);
 
+/// Gives a widget without a text a name, for screen readers and as a tooltip.
+void nameWidget(GtkWidget* widget, const char* name);
+
 } // namespace pallax::gtk

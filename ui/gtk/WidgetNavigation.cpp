@@ -50,15 +50,28 @@ WidgetNavigation::~WidgetNavigation() {
     for (const auto& [instance, handler] : _handlers) {
         g_signal_handler_disconnect(instance, handler);
     }
-    if (_detail != nullptr) { // which belongs to the next stack, too
-        adw_leaflet_remove(_others, _detail);
-    }
+    setDetail(nullptr); // which others use, too
 }
 
 /// A swipe does not go back to it: it is no pane.
 void WidgetNavigation::setDetail(GtkWidget* widget) {
+    _isShowing = true;
+    if (_detail != nullptr) {
+        adw_leaflet_remove(_others, _detail);
+    }
     _detail = widget;
-    adw_leaflet_page_set_navigatable(adw_leaflet_prepend(_others, widget), FALSE);
+    if (_detail != nullptr) {
+        adw_leaflet_page_set_navigatable(adw_leaflet_prepend(_others, _detail), FALSE);
+    }
+    _isShowing = false;
+    showPages();
+}
+
+void WidgetNavigation::showDetail(bool isShown) {
+    if (isShown) {
+        popTo(0, false);
+    }
+    _isDetailOnTop = isShown;
     showPages();
 }
 
@@ -72,6 +85,7 @@ void WidgetNavigation::add(ui::TableScreen& screen, AdwLeaflet* to) {
             popTo(static_cast<std::size_t>(found - _screens.begin()), false);
         }
     });
+    table.onLeaf(_frame.leafSelected);
     gtk_widget_set_size_request(table.widget(), kListWidth, -1);
     _isShowing = true; // the first page of an empty leaflet is shown at once
     adw_leaflet_append(to, table.widget());
@@ -79,6 +93,7 @@ void WidgetNavigation::add(ui::TableScreen& screen, AdwLeaflet* to) {
 }
 
 void WidgetNavigation::push(std::shared_ptr<ui::TableScreen> screen, bool animated) {
+    _isDetailOnTop = false;
     top().viewWillDisappear(animated);
     _screens.push_back(std::move(screen));
     add(top(), _others);
@@ -139,7 +154,10 @@ void WidgetNavigation::appear() {
 }
 
 void WidgetNavigation::back() {
-    if (!isAtRoot()) {
+    if (isDetailOnTop() && !isSideBySide()) {
+        showDetail(false);
+        _frame.changed();
+    } else if (!isAtRoot()) {
         popTo(_screens.size() - 2, true);
     }
 }
@@ -161,10 +179,11 @@ void WidgetNavigation::showPages() {
     GtkWidget* root = widgetTable(_screens.front()->table()).widget();
     if (!isAtRoot()) {
         adw_leaflet_set_visible_child(_others, widgetTable(top().table()).widget());
-    } else if (_detail != nullptr && isSideBySide()) {
+    } else if (_detail != nullptr) {
         adw_leaflet_set_visible_child(_others, _detail);
     }
-    adw_leaflet_set_visible_child(_columns.get(), isAtRoot() ? root : others);
+    const bool isRootSeen = isAtRoot() && !isDetailOnTop();
+    adw_leaflet_set_visible_child(_columns.get(), isRootSeen ? root : others);
     widgetTable(_screens.front()->table())
         .setOpenRow(isSideBySide() && !isAtRoot() ? std::optional(_screens[1]->title())
                                                   : std::nullopt);
@@ -172,7 +191,7 @@ void WidgetNavigation::showPages() {
 }
 
 void WidgetNavigation::adoptSwipe() {
-    if (_isShowing || isAtRoot() || isSideBySide()) {
+    if (_isShowing || isSideBySide() || (isAtRoot() && !_isDetailOnTop)) {
         return;
     }
     if (adw_leaflet_get_child_transition_running(_columns.get()) != FALSE ||
@@ -181,7 +200,8 @@ void WidgetNavigation::adoptSwipe() {
     }
     GtkWidget* root = widgetTable(_screens.front()->table()).widget();
     if (adw_leaflet_get_visible_child(_columns.get()) == root) {
-        return popTo(0, true);
+        _isDetailOnTop = false;
+        return isAtRoot() ? _frame.changed() : popTo(0, true);
     }
     GtkWidget* shown = adw_leaflet_get_visible_child(_others);
     for (std::size_t index = 1; index + 1 < _screens.size(); ++index) {

@@ -20,6 +20,7 @@ public:
     struct Frame {
         std::function<void()> changed; ///< the topmost pane is another one
         std::function<void()> toolbarShown;
+        std::function<void(const std::string& path, const std::string& text)> leafSelected;
         std::function<void()> modalChanged; ///< a modal screen was presented or dismissed
     };
 
@@ -50,8 +51,11 @@ public:
     bool isSideBySide() const { return adw_leaflet_get_folded(_columns.get()) == FALSE; }
 
     GtkWidget* widget() const { return GTK_WIDGET(_columns.get()); }
-    /// What stands beside the root pane while no other is open.
+    /// What stands beside the root pane while no other is open, instead of what did; null: nothing.
     void setDetail(GtkWidget* widget);
+    /// Whether the detail is shown over the root pane, where there is no room beside it.
+    void showDetail(bool isShown);
+    bool isDetailOnTop() const { return _isDetailOnTop && isAtRoot(); }
 
 private:
     void add(ui::TableScreen& screen, AdwLeaflet* to);
@@ -71,6 +75,7 @@ private:
     ui::NavigationDelegate* _delegate = nullptr;
     std::shared_ptr<ui::ModalScreen> _modal;
     bool _isToolbarShown = false;
+    bool _isDetailOnTop = false;
     bool _isShowing = false; ///< the pages are being changed by us
     std::vector<std::pair<gpointer, gulong>> _handlers;
     std::shared_ptr<WidgetNavigation*> _alive = std::make_shared<WidgetNavigation*>(this);

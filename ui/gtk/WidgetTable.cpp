@@ -239,7 +239,13 @@ void WidgetTable::activate(guint position) {
     const std::size_t row = pane().rowAt(position);
     _selecting();
     pane().moveCursorTo(position);
+    const PaneRow selected = pane().row(row);
+    const std::string path = childPath(pane().path(), selected.name);
+    const auto leafSelected = _leafSelected;
     _source.didSelectRow(row);
+    if (!selected.isBranch) {
+        leafSelected(path, selected.text.value_or(""));
+    }
 }
 
 bool WidgetTable::hasFocus(const Bound& bound) {

@@ -42,6 +42,10 @@ public:
     GtkWidget* widget() const { return GTK_WIDGET(_widget.get()); }
     /// Called before a row is selected.
     void onSelecting(std::function<void()> action) { _selecting = std::move(action); }
+    /// Called after a row with a value was selected, with its path in the display and its text.
+    void onLeaf(std::function<void(const std::string& path, const std::string& text)> action) {
+        _leafSelected = std::move(action);
+    }
     /// Marks the row whose pane is shown beside the table; nothing: none is.
     void setOpenRow(std::optional<std::string> name);
     void setFilter(std::string text);
@@ -92,6 +96,8 @@ private:
     std::map<std::string, double> _offsets; ///< of rows that are scrolled sideways, by name
     std::optional<std::string> _openRow;
     std::function<void()> _selecting = [] {};
+    std::function<void(const std::string&, const std::string&)> _leafSelected =
+        [](const std::string& /*path*/, const std::string& /*text*/) {};
     double _inset;
     double _width; ///< of a cell's content, in points
     std::vector<std::pair<gpointer, gulong>> _handlers;

@@ -69,9 +69,12 @@ std::unique_ptr<ui::NavigationStack>
 WidgetToolkit::makeNavigationStack(std::shared_ptr<ui::TableScreen> root) {
     return std::make_unique<WidgetNavigation>(
         std::move(root), _guard,
-        WidgetNavigation::Frame{.changed = [this] { _frame.refresh(); },
-                                .toolbarShown = [this] { _frame.refresh(); },
-                                .modalChanged = [this] { _frame.modalChanged(); }});
+        WidgetNavigation::Frame{
+            .changed = [this] { _frame.refresh(); },
+            .toolbarShown = [this] { _frame.refresh(); },
+            .leafSelected = [this](const std::string& path,
+                                   const std::string& text) { _frame.leafSelected(path, text); },
+            .modalChanged = [this] { _frame.modalChanged(); }});
 }
 
 std::unique_ptr<ui::ScreenView> WidgetToolkit::makeScreenView() {

@@ -73,8 +73,9 @@ private:
             return line(gtk_spinner_get_spinning(GTK_SPINNER(widget)) != FALSE ? "spinner: turns"
                                                                                : "spinner");
         }
-        if (GTK_IS_BUTTON(widget)) {
-            const char* label = gtk_button_get_label(GTK_BUTTON(widget));
+        if (GTK_IS_BUTTON(widget) || GTK_IS_MENU_BUTTON(widget)) {
+            const char* label =
+                GTK_IS_BUTTON(widget) ? gtk_button_get_label(GTK_BUTTON(widget)) : nullptr;
             const char* tooltip = gtk_widget_get_tooltip_text(widget);
             return line(std::string("button: ") +
                         (label != nullptr     ? label
@@ -85,6 +86,16 @@ private:
         if (GTK_IS_EDITABLE(widget)) {
             return line(std::string("field: \"") + gtk_editable_get_text(GTK_EDITABLE(widget)) +
                         "\"");
+        }
+        if (GTK_IS_LEVEL_BAR(widget)) {
+            return line("level: " + number(gtk_level_bar_get_value(GTK_LEVEL_BAR(widget)) * 100) +
+                        " %");
+        }
+        if (GTK_IS_SCALE(widget)) {
+            return line("scale: " + number(gtk_range_get_value(GTK_RANGE(widget)) * 100) + " %");
+        }
+        if (GTK_IS_IMAGE(widget)) {
+            return;
         }
         if (GTK_IS_LABEL(widget)) {
             const std::string text = gtk_label_get_text(GTK_LABEL(widget));
@@ -146,9 +157,11 @@ private:
     static std::string notes(GtkWidget* row) {
         std::string text;
         GtkWidget* box = gtk_widget_get_first_child(row);
-        for (GtkWidget* child : childrenOf(gtk_widget_get_last_child(box))) {
+        for (GtkWidget* child :
+             childrenOf(gtk_widget_get_first_child(gtk_widget_get_last_child(box)))) {
             if (GTK_IS_LABEL(child)) {
-                text += std::string(" ") + gtk_label_get_text(GTK_LABEL(child));
+                const std::string words = gtk_label_get_text(GTK_LABEL(child));
+                text += words.empty() ? "" : " " + words;
             } else if (GTK_IS_IMAGE(child)) {
                 const char* icon = gtk_image_get_icon_name(GTK_IMAGE(child));
                 text += icon != nullptr ? std::string(" [") + icon + "]" : "";

@@ -1,0 +1,59 @@
+#include "window/Programs.h"
+
+#include <filesystem>
+#include <gio/gio.h>
+#include <memory>
+
+namespace pallax {
+
+namespace {
+
+struct Waiting {
+    MainQueue& queue;
+    std::function<void(const std::string&)> ended;
+};
+
+/// Comes from GLib's loop, so only posts.
+void finished(GObject* process, GAsyncResult* result, gpointer data) {
+    const std::unique_ptr<Waiting> waiting(static_cast<Waiting*>(data));
+    gchar* text = nullptr;
+    (void)g_subprocess_communicate_utf8_finish(G_SUBPROCESS(process), result, nullptr, &text,
+                                               nullptr);
+    const bool isDone = g_subprocess_get_successful(G_SUBPROCESS(process)) != FALSE;
+    std::string complaint = isDone ? "" : text != nullptr ? text : "The program was ended.";
+    g_free(text);
+    waiting->queue.async(
+        [ended = waiting->ended, complaint = std::move(complaint)] { ended(complaint); });
+}
+
+} // namespace
+
+void runBeside(MainQueue& queue, const std::vector<std::string>& words,
+               const std::function<void(const std::string& complaint)>& ended) {
+    std::vector<const char*> arguments;
+    for (const std::string& word : words) {
+        arguments.push_back(word.c_str());
+    }
+    arguments.push_back(nullptr);
+    GError* error = nullptr;
+    GSubprocess* process =
+        g_subprocess_newv(arguments.data(), G_SUBPROCESS_FLAGS_STDERR_PIPE, &error);
+    if (process == nullptr) {
+        queue.async([ended, complaint = std::string(error->message)] { ended(complaint); });
+        g_error_free(error);
+        return;
+    }
+    g_subprocess_communicate_utf8_async(process, nullptr, nullptr, finished,
+                                        new Waiting{queue, ended});
+    g_object_unref(process);
+}
+
+std::string windowProgram() {
+    return std::filesystem::read_symlink("/proc/self/exe").string();
+}
+
+std::string terminalProgram() {
+    return std::filesystem::path(windowProgram()).replace_filename("pallax").string();
+}
+
+} // namespace pallax
