@@ -238,7 +238,7 @@ TEST_F(StoredReportTest, NumbersOfAFileThatNobodyWroteAreASentenceOrAReport) {
     drive(1, std::chrono::seconds(10));
     (void)load(write("drive.pcap"));
     const auto change = [&](const char* sql) {
-        MeasurementStore store(file);
+        FileStore store(file);
         store.connection().run(sql);
     };
     change("UPDATE intervals SET hold = 9000000000000000000 WHERE id % 2");
