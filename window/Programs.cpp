@@ -31,6 +31,7 @@ void finished(GObject* process, GAsyncResult* result, gpointer data) {
 void runBeside(MainQueue& queue, const std::vector<std::string>& words,
                const std::function<void(const std::string& complaint)>& ended) {
     std::vector<const char*> arguments;
+    arguments.reserve(words.size() + 1);
     for (const std::string& word : words) {
         arguments.push_back(word.c_str());
     }

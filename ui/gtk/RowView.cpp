@@ -152,8 +152,38 @@ void RowView::place(GtkLabel* label, const ui::Label& content, const ui::Rect& a
     gtk_widget_set_visible(GTK_WIDGET(label), TRUE);
 }
 
+bool RowView::isSame(const Shown& shown, const Shown& other) {
+    const auto sameLabel = [](const ui::Label& one, const ui::Label& another) {
+        return one.text == another.text && one.font == another.font && one.frame == another.frame;
+    };
+    const auto extent = [](const Shown& of) {
+        return of.container ? of.container->contentSize : ui::Size();
+    };
+    return shown.scale == other.scale && shown.accessory == other.accessory &&
+           shown.notes == other.notes &&
+           shown.container.has_value() == other.container.has_value() &&
+           extent(shown) == extent(other) &&
+           std::equal(shown.labels.begin(), shown.labels.end(), other.labels.begin(),
+                      other.labels.end(), sameLabel);
+}
+
 void RowView::fill(const ui::TableCell& cell, const RowNotes& notes) {
     const ui::CellContents contents = cell.contents();
+    Shown wanted{.labels = {},
+                 .container = {},
+                 .accessory = cell.accessory(),
+                 .notes = notes,
+                 .scale = _metrics.scale()};
+    for (const ui::Label* label : contents.labels) {
+        wanted.labels.push_back(*label);
+    }
+    if (contents.container != nullptr) {
+        wanted.container = *contents.container;
+    }
+    if (isSame(_shown, wanted)) {
+        return;
+    }
+    _shown = std::move(wanted);
     const ui::ScrollContainer* container = contents.container;
     const ui::Rect area = container != nullptr ? ui::Rect() : cell.contentBounds();
     for (std::size_t index = 0; index < contents.labels.size(); ++index) {

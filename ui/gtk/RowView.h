@@ -7,6 +7,7 @@
 
 #include <functional>
 #include <gtk/gtk.h>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -22,6 +23,7 @@ struct RowNotes {
     std::string age;   ///< of a value that is overdue
     bool hasChanged = false;
     bool isOpen = false; ///< its pane is shown beside it
+    bool operator==(const RowNotes&) const = default;
 };
 
 /// The widgets of one row. The labels of a cell are placed as the cell says, in a container that
@@ -52,7 +54,18 @@ private:
     void showAge(const ui::CellContents& contents, const std::string& age);
     void listen(const Guard& guard, std::function<void(double)> scrolled);
 
+    /// What is shown, to leave a row alone that stays as it is.
+    struct Shown {
+        std::vector<ui::Label> labels;
+        std::optional<ui::ScrollContainer> container;
+        ui::CellAccessory accessory = ui::CellAccessory::None;
+        RowNotes notes;
+        double scale = 0;
+    };
+    static bool isSame(const Shown& shown, const Shown& other);
+
     const PangoMetrics& _metrics;
+    Shown _shown;
     Ref<GtkBox> _box;
     GtkScrolledWindow* _scroller; // the box owns it and what follows
     GtkFixed* _content;

@@ -1,9 +1,12 @@
 #include "ui/gtk/WidgetNavigation.h"
 
+#include "platform/ui/ModalScreen.h"
 #include "ui/gtk/WidgetTable.h"
 
 #include <algorithm>
 #include <chrono>
+#include <iterator>
+#include <optional>
 #include <utility>
 
 namespace pallax::gtk {

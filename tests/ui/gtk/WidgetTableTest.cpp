@@ -98,6 +98,21 @@ TEST_F(WidgetTableRows, WhatHasChangedIsMarkedForOneTick) {
     EXPECT_FALSE(isMarked());
 }
 
+TEST_F(WidgetTableRows, ARowThatStaysAsItIsIsLeftAlone) {
+    WindowStage stage(360, 400);
+    stage.tick(Dictionary{{"A", "1"}});
+    const auto name = [&] {
+        return GTK_LABEL(WindowStage::found(rowWidget(stage, 0), [](GtkWidget* widget) {
+            return GTK_IS_LABEL(widget) && *gtk_label_get_text(GTK_LABEL(widget)) != '\0';
+        }));
+    };
+    gtk_label_set_text(name(), "painted over");
+    stage.tick(Dictionary{{"A", "1"}});
+    EXPECT_STREQ(gtk_label_get_text(name()), "painted over");
+    stage.tick(Dictionary{{"A", "2"}});
+    EXPECT_STREQ(gtk_label_get_text(name()), "A");
+}
+
 TEST_F(WidgetTableRows, ScreenReadersHearNameAndValue) {
     WindowStage stage(360, 400);
     stage.tick(Dictionary{{"RSRP", "1"}, {"List", Array{Dictionary{}, Dictionary{}}}});
