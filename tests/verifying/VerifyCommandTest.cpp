@@ -13,6 +13,7 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <regex>
 
 namespace pallax {
 namespace {
@@ -67,8 +68,12 @@ TEST_F(VerifyCommandTest, ARecordingIsWhatItWasAfterAnUpdate) {
     const std::string drive = copyOf("lte-drive.pcap");
     EXPECT_EQ(verify({.recordings = {drive}, .update = true}), kExitSuccess);
     EXPECT_EQ(text, "");
-    EXPECT_EQ(doubles::contentOf(digestFileOf(drive)),
-              doubles::contentOf(digestFileOf(sample("lte-drive.pcap"))));
+    // The sample's was written by an earlier version.
+    const auto withoutDecoder = [](const std::string& file) {
+        return std::regex_replace(doubles::contentOf(digestFileOf(file)),
+                                  std::regex("\ndecoder [0-9.]+\n"), "\n");
+    };
+    EXPECT_EQ(withoutDecoder(drive), withoutDecoder(sample("lte-drive.pcap")));
     EXPECT_EQ(verify({.recordings = {drive}}), kExitSuccess);
     EXPECT_TRUE(text.starts_with(drive + ": ")) << text;
 }

@@ -11,12 +11,13 @@ namespace pallax::doubles {
 
 namespace {
 
-/// Becomes the server, which writes the number of its display to the descriptor.
+/// Becomes the server, which writes the number of its display to the descriptor. It does not start
+/// afresh when its last client leaves: a program that connects meanwhile would find no display.
 [[noreturn]] void serve(int descriptor) {
     (void)::prctl(PR_SET_PDEATHSIG, SIGTERM);
     (void)::dup2(::open("/dev/null", O_RDWR), STDERR_FILENO);
     (void)::execlp("Xvfb", "Xvfb", "-displayfd", std::to_string(descriptor).c_str(), "-screen", "0",
-                   "1280x1024x24", "-nolisten", "tcp", nullptr);
+                   "1280x1024x24", "-nolisten", "tcp", "-noreset", nullptr);
     ::_exit(1);
 }
 
