@@ -77,8 +77,8 @@ that cannot be read from the middle (from a pipe, compressed, or several):
 256 MiB and, live, 24 hours at most (pallax.conf(5), journal-mebibytes).
 
 Several recordings are one, in the order of their times, and each continues the
-state of the one before. A column of numbers is
-NULL where the display has a text instead ("Not Present").
+state of the one before. A column of numbers is NULL where the display has a
+text instead ("Not Present").
 
 Exit status:
   0   success, or the reader of the output has gone

@@ -95,8 +95,7 @@ milliseconds. A server has the dialect of ClickHouse, and no sections.
 
 Exit status:
   0   success, or the reader of the output has gone
-  1   failure: a recording was refused or is damaged, or the store cannot be
-      read or written, as a sentence on standard error tells
+  1   failure: the store failed, or a recording was refused or is damaged
   2   wrong usage, or a wrong query)";
 
 using Question = StoreAskOptions::Question;

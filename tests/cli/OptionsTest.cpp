@@ -4,6 +4,7 @@
 
 #include <filesystem>
 #include <fstream>
+#include <regex>
 #include <sstream>
 
 namespace pallax {
@@ -325,7 +326,13 @@ TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
         const std::size_t examples = help.text.find("\nExamples:\n  ");
         const std::size_t options = help.text.find("\nOptions:\n  ");
         EXPECT_LT(examples, options) << help.text;
-        EXPECT_LT(options, help.text.find("\nExit status:\n  0   success")) << help.text;
+        const std::string statuses = "\nExit status:\n";
+        const std::size_t end = help.text.find(statuses + "  0   success");
+        EXPECT_LT(options, end) << help.text;
+        ASSERT_NE(end, std::string::npos);
+        EXPECT_TRUE(std::regex_match(help.text.substr(end + statuses.size()),
+                                     std::regex("(  [0-9]+ +[^\n]+\n)+")))
+            << help.text;
         std::istringstream lines(help.text);
         for (std::string line; std::getline(lines, line);) {
             EXPECT_TRUE(line.size() <= 80 || line.starts_with("  PAGE ")) << line;
