@@ -103,6 +103,7 @@ ServerQuestion cellsQuestion(const StoreAskOptions& options, const std::vector<J
                              const AskedTime& time, const ServerStore& store) {
     const Part part(time);
     std::vector<std::string> queries;
+    queries.reserve(levels.size());
     for (const JudgedLevel& level : levels) {
         queries.push_back(
             formatText("SELECT system, cell, %@ AS level, %@ AS border, uniqExactIf(device, %@) AS "
@@ -175,6 +176,7 @@ ServerQuestion coverageQuestion(const StoreAskOptions& options,
                                 const ServerStore& store) {
     const Part part(time);
     std::vector<std::string> queries;
+    queries.reserve(levels.size());
     for (const JudgedLevel& level : levels) {
         std::string sums;
         for (const Grade grade : {Grade::Excellent, Grade::Good, Grade::Fair, Grade::Poor}) {
