@@ -8,6 +8,8 @@
 namespace pallax {
 namespace {
 
+using doubles::getRequest;
+using doubles::HttpClient;
 using doubles::PallaxProcess;
 
 class EndToEndWebFaults : public EndToEndWeb {
@@ -51,8 +53,11 @@ TEST_F(EndToEndWebFaults, ARecordingThatIsCutIsShownAndItsEndIsAFailure) {
     const std::string cut = file("cut.pcap", whole.substr(0, whole.size() - 5));
     PallaxProcess web(world, {"web", cut, "--speed", "max"});
     enter(web);
-    EXPECT_TRUE(doubles::eventually(
-        [&] { return get("/api/figures").find("\"ticks\":0") == std::string::npos; }));
+    HttpClient viewer(port);
+    viewer.send(getRequest("/api/events", host, cookie));
+    const std::string end = "data: {\"text\":\"End of the recording\"}\n\n";
+    EXPECT_NE(viewer.receive(end).find(end), std::string::npos);
+    EXPECT_EQ(get("/api/figures").find("\"ticks\":0"), std::string::npos);
     web.signal(SIGINT);
     EXPECT_EQ(web.wait(), 1);
     EXPECT_EQ(web.err(), "pallax: " + cut + " ends in the middle of a packet.\n");
