@@ -43,7 +43,7 @@ public:
     ScreenSession(const ScreenSession&) = delete;
     ScreenSession& operator=(const ScreenSession&) = delete;
 
-    /// Connects and goes on until the queue stops.
+    /// Connects and runs until the queue stops.
     void start() { _viewer.start(); }
     /// As ViewerSession.
     bool hasLostSource() const { return _viewer.hasLostSource(); }

@@ -72,7 +72,7 @@ public:
     void attach(ui::Toolkit& toolkit);
     /// Terminates the application, while its toolkit still exists. Nothing comes after it.
     void detach() { _session.reset(); }
-    /// Connects and goes on until the queue stops.
+    /// Connects and runs until the queue stops.
     void start();
     /// True when the child ended by itself; the queue is then stopped.
     bool hasLostSource() const { return _session->hasLostSource(); }

@@ -16,7 +16,7 @@ QueryKnowledge installedKnowledge();
 struct ProfileChoice {
     std::string name;
     bool isOfUser = true;     ///< given on the command line, so that an unknown one is wrong usage
-    std::string command = {}; ///< whose help tells of profiles; empty: none
+    std::string command = {}; ///< its help lists the profiles; empty: none does
 };
 /// The profile or, after a complaint, the exit status.
 Result<QualityProfile, ExitStatus> profileOrComplaint(const ProfileChoice& choice);

@@ -24,7 +24,8 @@ class ClickHouse {
 public:
     explicit ClickHouse(const StoreAddress& address, Patience patience = {});
 
-    /// Runs a statement without rows. With `isInDatabase` false, the database need not exist.
+    /// Runs a statement that returns no rows. With `isInDatabase` false, the database need not
+    /// exist.
     void run(const std::string& statement, bool isInDatabase = true);
     /// Rows of a query, which can only read. `refused` is called instead of throwing what the
     /// server says of the query, if it is given. Whole answers only: a shard that is missing, or an

@@ -167,7 +167,8 @@ void ServerStore::add(const LoadedRecording& recording) {
     _recording = recording;
     _recording.id = numberOfLoad();
     for (const LoadedRecording& before : _replaced) {
-        _recording.id = std::max(_recording.id, before.id + 1); // whatever that machine's clock
+        // Even if the clock of the machine that loaded it is ahead.
+        _recording.id = std::max(_recording.id, before.id + 1);
     }
 }
 
@@ -241,7 +242,7 @@ void ServerStore::addCells(const RecordingMeasurements& measurements) {
 }
 
 void ServerStore::addFields(const RecordingMeasurements& measurements) {
-    std::map<std::string, std::string> known; // what the store tells of each
+    std::map<std::string, std::string> known; // the digest that the store has for each name
     for (const auto& row : _server.rows(
              "SELECT name, argMax(content, load) FROM " + table("fields") + " GROUP BY name", 2)) {
         known.emplace(textOf(row[0]), textOf(row[1]));

@@ -42,7 +42,7 @@ bool haveSameBeginning(const LoadedRecording& one, const LoadedRecording& other)
 
 /// The recordings of a store: a file, or a database on a server. One recording is written at a
 /// time: begin(), remove() for what it replaces, add(), parts of what it measures, finish(). Until
-/// finish() returns, nobody sees any of it. All functions may throw StoreFailure.
+/// finish() returns, no query shows any of it. All functions may throw StoreFailure.
 class MeasurementStore {
 public:
     virtual ~MeasurementStore() = default;

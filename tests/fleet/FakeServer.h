@@ -9,8 +9,7 @@
 
 namespace pallax::doubles {
 
-/// A server on this machine that answers every connection with the same bytes, whatever it is
-/// asked.
+/// A server on this machine that gives the same bytes in answer to every request.
 class FakeServer {
 public:
     enum class Then { Closes, Stalls };

@@ -22,7 +22,8 @@ protected:
                                          },
                                          [this] { ++lost; }});
     }
-    /// What was seen since the last call. The system tells of changes before it returns from them.
+    /// What was seen since the last call. The system reports a change before the call that makes it
+    /// returns.
     std::vector<std::string> taken() {
         for (int round = 0; round < 10; ++round) {
             _queue.runReady();

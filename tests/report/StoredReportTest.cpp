@@ -248,7 +248,7 @@ TEST_F(StoredReportTest, NumbersOfAFileThatNobodyWroteAreASentenceOrAReport) {
     change("UPDATE intervals SET hold = -9000000000000000000");
     change("DELETE FROM sites");
     change("UPDATE series SET step = 'x', format = '%s%n%q', last_row = 9000000000000000000");
-    (void)made(whole()); // whatever it says, it ends
+    (void)made(whole()); // a report or a sentence, but it ends
     change("UPDATE recordings SET first = -9000000000000000000, last = 9000000000000000000");
     EXPECT_EQ(refusal(whole()), "The recordings of that time last more than 100 days, which is too "
                                 "much for a page; choose less with --from and --to.");

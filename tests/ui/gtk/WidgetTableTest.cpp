@@ -131,7 +131,7 @@ TEST_F(WidgetTableRows, ScreenReadersHearNameAndValue) {
 TEST_F(WidgetTableRows, OnlyRowsInViewAreAskedFor) {
     WindowStage stage(360, 400);
     stage.tick(rows(1000));
-    // Rows that nobody asked for at the tick of a change do not know of it.
+    // A row that is not asked for at the tick of a change does not show it later.
     stage.tick(rows(1000, "2"));
     EXPECT_TRUE(stage.table().pane().row(2).hasChanged);
     int asked = 0;
