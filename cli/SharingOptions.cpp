@@ -63,7 +63,8 @@ The page is one file that any browser opens, without a network: a verdict on
 each level, curves, the cells and states over time, neighbours, events, and the
 whole state at each display tick, which is every two seconds. Two recordings
 are shown beside each other. The numbered parts of one (drive-0001.pcapng,
-drive-0002.pcapng) are read as one.
+drive-0002.pcapng) are read as one. A store is a file, or an address of one on a
+server (clickhouse://HOST/DATABASE).
 
 Levels, cells and states are those that the display shows at its ticks. Each
 stands for the time until the next tick, at most 10 s. Shares of time, the

@@ -26,7 +26,8 @@ and neighbours, lists events, and has the whole state at any time since then.
 A recording is played at its own pace; --speed max shows all of it at once. A
 recording with the name "demo" needs its folder (pallax web ./demo).
 
-With --store, the page is that of pallax report --store, made once at the start.
+With --store, the page is that of pallax report --store, made once at the start,
+from a file or from a server (clickhouse://HOST/DATABASE).
 
 The link holds a secret, which is new at each start and without which nothing
 is served. Only programs of this machine can connect. From another machine,

@@ -2,6 +2,7 @@
 
 #include "query/Database.h"
 
+#include <cstdint>
 #include <functional>
 #include <stdexcept>
 #include <string>
@@ -15,6 +16,11 @@ class NoAnswer : public std::runtime_error {
 public:
     using std::runtime_error::runtime_error;
 };
+
+/// The number in a cell; 0 if there is none.
+std::int64_t integerOf(const QueryValue& cell);
+/// The text in a cell; empty if there is none.
+std::string textOf(const QueryValue& cell);
 
 /// Reads an answer of ClickHouse in the format TabSeparatedWithNamesAndTypes, in pieces of any
 /// size. Integers and real numbers become numbers, NULL and NaN become NULL, everything else a

@@ -134,9 +134,8 @@ void ClickHouse::ask(const std::string& query, const AnswerRows::TakeColumns& ta
     }
 }
 
-std::vector<std::vector<QueryValue>> ClickHouse::rows(const std::string& query,
-                                                      std::size_t columns) {
-    std::vector<std::vector<QueryValue>> all;
+void ClickHouse::eachRow(const std::string& query, std::size_t columns,
+                         const AnswerRows::TakeRow& take) {
     ask(
         query,
         [&](const std::vector<std::string>& names) {
@@ -144,7 +143,13 @@ std::vector<std::vector<QueryValue>> ClickHouse::rows(const std::string& query,
                 throw NoAnswer("it has other columns");
             }
         },
-        [&](std::vector<QueryValue> row) { all.push_back(std::move(row)); });
+        take);
+}
+
+std::vector<std::vector<QueryValue>> ClickHouse::rows(const std::string& query,
+                                                      std::size_t columns) {
+    std::vector<std::vector<QueryValue>> all;
+    eachRow(query, columns, [&](std::vector<QueryValue> row) { all.push_back(std::move(row)); });
     return all;
 }
 

@@ -33,7 +33,9 @@ public:
     using Refused = std::function<void(const ServerRefusal& refusal)>;
     void ask(const std::string& query, const AnswerRows::TakeColumns& takeColumns,
              const AnswerRows::TakeRow& takeRow, const Refused& refused = {});
-    /// The rows of a query with that many columns.
+    /// Gives the rows of a query with that many columns one by one.
+    void eachRow(const std::string& query, std::size_t columns, const AnswerRows::TakeRow& take);
+    /// All of them.
     std::vector<std::vector<QueryValue>> rows(const std::string& query, std::size_t columns);
     /// Inserts rows in the format RowBinary. Returns when all shards have them.
     void insert(const std::string& tableAndColumns, const HttpExchange::Give& give);

@@ -4,6 +4,7 @@
 #include "query/CellFinder.h"
 #include "text/NumberFormat.h"
 
+#include <algorithm>
 #include <array>
 #include <chrono>
 #include <cmath>
@@ -17,6 +18,7 @@ constexpr std::int64_t kMinute = 60'000; ///< milliseconds
 constexpr std::int64_t kMinutesOfDay = std::int64_t{24} * 60;
 constexpr double kStepsOfReal = 16; ///< levels come in halves, quarters or sixteenths of a decibel
 constexpr std::array<std::int64_t, 5> kScales{1, 10, 100, 1000, 10000};
+constexpr double kExact = 9e15; ///< whole numbers up to it are numbers of a double
 
 struct Divided {
     std::int64_t quotient;
@@ -80,8 +82,19 @@ std::uint32_t monthOf(std::int64_t milliseconds) {
            static_cast<unsigned>(date.month());
 }
 
+/// As the view `measurement` makes it.
+std::string decimalText(double number, std::size_t decimals) {
+    const std::int64_t scale = kScales.at(std::min(decimals, kScales.size() - 1));
+    const double scaled = std::round(std::abs(number) * static_cast<double>(scale));
+    const auto digits = static_cast<std::int64_t>(std::min(scaled, kExact));
+    std::string text = (number < 0 ? "-" : "") + std::to_string(digits / scale);
+    if (decimals > 0) {
+        text += "." + std::to_string(scale + digits % scale).substr(1);
+    }
+    return text;
+}
+
 DecimalText decimalTextOf(double number, std::string_view text) {
-    constexpr double kExact = 9e15; // whole numbers up to it are numbers of a double
     const std::size_t start = text.starts_with('-') ? 1 : 0;
     const std::size_t end = std::min(text.find_first_not_of("0123456789.", start), text.size());
     const std::size_t point = text.substr(0, end).find('.');
@@ -89,18 +102,9 @@ DecimalText decimalTextOf(double number, std::string_view text) {
     if (decimals >= kScales.size()) {
         return {};
     }
-    // As the view `measurement` makes it.
-    const std::int64_t scale = kScales.at(decimals);
-    const double scaled = std::abs(number) * static_cast<double>(scale);
-    if (scaled != std::floor(scaled) || scaled > kExact) {
-        return {};
-    }
-    const auto digits = static_cast<std::int64_t>(scaled);
-    std::string made = (number < 0 ? "-" : "") + std::to_string(digits / scale);
-    if (decimals > 0) {
-        made += "." + std::to_string(scale + digits % scale).substr(1);
-    }
-    if (made != text.substr(0, end)) {
+    const double scaled = std::abs(number) * static_cast<double>(kScales.at(decimals));
+    if (scaled != std::floor(scaled) || scaled > kExact ||
+        decimalText(number, decimals) != text.substr(0, end)) {
         return {};
     }
     return {static_cast<std::int8_t>(decimals), text.substr(end)};

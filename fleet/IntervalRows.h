@@ -4,7 +4,9 @@
 #include "store/IntervalBatch.h"
 #include "store/MeasurementStore.h"
 
+#include <cstddef>
 #include <cstdint>
+#include <string>
 #include <string_view>
 
 namespace pallax {
@@ -25,7 +27,10 @@ struct DecimalText {
     std::string_view suffix = {};
 };
 
-/// How the text of a number can be made of it again, exactly.
+/// "-92.25": the number with up to four decimals.
+std::string decimalText(double number, std::size_t decimals);
+
+/// How the text of a number can be made of it again, exactly, by decimalText().
 DecimalText decimalTextOf(double number, std::string_view text);
 
 /// Appends an interval of a batch as a row of a recording, whose `id` is the number of the load.

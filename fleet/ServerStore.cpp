@@ -15,6 +15,7 @@
 #include <random>
 #include <set>
 #include <thread>
+#include <tuple>
 #include <utility>
 
 namespace pallax {
@@ -27,16 +28,6 @@ constexpr const char* kLoadColumns =
 constexpr std::size_t kLoadColumnCount = 14;
 /// Rows are sent in pieces of about this size.
 constexpr std::size_t kPiece = std::size_t{1} << 20U;
-
-std::int64_t integerOf(const QueryValue& value) {
-    const auto* integer = std::get_if<std::int64_t>(&value);
-    return integer != nullptr ? *integer : 0;
-}
-
-std::string textOf(const QueryValue& value) {
-    const auto* text = std::get_if<std::string>(&value);
-    return text != nullptr ? *text : std::string();
-}
 
 /// A row of kLoadColumns.
 LoadedRecording recordingOf(const std::vector<QueryValue>& row) {
@@ -134,6 +125,14 @@ std::vector<LoadedRecording> ServerStore::loads(const std::string& condition,
             recordings.push_back(recordingOf(row));
         }
     }
+    return recordings;
+}
+
+std::vector<LoadedRecording> ServerStore::ofDevice(const std::string& device) {
+    std::vector<LoadedRecording> recordings = loads("device = " + clickHouseText(device), "digest");
+    std::sort(recordings.begin(), recordings.end(), [](const auto& one, const auto& other) {
+        return std::tie(one.first, one.name) < std::tie(other.first, other.name);
+    });
     return recordings;
 }
 

@@ -24,6 +24,9 @@ public:
     /// The condition that a row of a base table is of a current load, for each shard by itself.
     std::string currentLoads() const;
 
+    /// The current recordings of a device in the order of their beginnings.
+    std::vector<LoadedRecording> ofDevice(const std::string& device);
+
     std::optional<LoadedRecording> withDigest(const std::string& digest) override;
     std::vector<LoadedRecording> beginningAt(const std::string& technology,
                                              std::int64_t first) override;

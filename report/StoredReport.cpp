@@ -30,7 +30,7 @@ public:
     using std::runtime_error::runtime_error;
 };
 
-constexpr std::int64_t kMicroseconds = 1000; // in a millisecond
+constexpr const char* kNothing = "The store has nothing of %@ in that time.";
 
 constexpr const char* kWithoutDisplay =
     "A store does not hold the display: its state at each tick is left out. Levels, cells, "
@@ -38,14 +38,6 @@ constexpr const char* kWithoutDisplay =
 
 constexpr const char* kWithoutContexts =
     "Contexts are not shown: their names can identify a person, so the store leaves them out.";
-
-struct StoredDrive {
-    StoredTicks::Recording recording;
-    std::string name;
-    std::string technology;
-    std::uint64_t packets = 0;
-    std::string trouble;
-};
 
 /// Of milliseconds since 1970, of which a file may have any.
 Time timeOf(std::int64_t time) {
@@ -63,15 +55,11 @@ std::string listed(const std::vector<std::string>& names) {
     return text + (names.size() > kMost ? " and others" : "");
 }
 
-std::string deviceOf(StoreConnection& store, const StoredReportRequest& request) {
-    std::vector<std::string> devices;
-    Statement find = store.prepare("SELECT DISTINCT device FROM recordings ORDER BY device");
-    while (find.step()) {
-        devices.push_back(find.text(0));
-    }
+std::string deviceOf(StoredRecordings& store, const StoredReportRequest& request) {
+    const std::vector<std::string> devices = store.devices();
     if (devices.empty()) {
         throw NoReport(
-            formatText("The store %@ is empty (see pallax store load).", {request.file}));
+            formatText("The store %@ is empty (see pallax store load).", {request.store}));
     }
     if (!request.device) {
         if (devices.size() > 1) {
@@ -88,31 +76,29 @@ std::string deviceOf(StoreConnection& store, const StoredReportRequest& request)
     return *request.device;
 }
 
-std::vector<StoredDrive> drivesOf(StoreConnection& store, const std::string& device) {
+using StoredDrive = StoredTicks::Recording;
+
+std::vector<StoredDrive> drivesOf(StoredRecordings& store, const std::string& device) {
     std::vector<StoredDrive> drives;
-    Statement find = store.prepare("SELECT id, name, technology, every, packets, first, last, "
-                                   "coalesce(trouble, '') FROM recordings WHERE device = ? "
-                                   "ORDER BY first, name");
-    enum DriveColumn : int { kId, kName, kTechnology, kEvery, kPackets, kFirst, kLast, kTrouble };
-    find.bind(1, device);
-    while (find.step()) {
-        drives.push_back({{find.integer(kId), timeOf(find.integer(kFirst)),
-                           timeOf(find.integer(kLast)), find.text(kEvery) == "packet"},
-                          find.text(kName),
-                          find.text(kTechnology),
-                          static_cast<std::uint64_t>(find.integer(kPackets)),
-                          find.text(kTrouble)});
+    for (LoadedRecording& loaded : store.ofDevice(device)) {
+        const Time first = timeOf(loaded.first);
+        const Time last = timeOf(loaded.last);
+        drives.push_back({std::move(loaded), first, last});
     }
     return drives;
+}
+
+std::uint64_t packetsOf(const StoredDrive& drive) {
+    return static_cast<std::uint64_t>(drive.loaded.packets);
 }
 
 /// The time of the report, in what the store has of the device.
 DecodeWindow windowOf(const StoredReportRequest& request, const std::vector<StoredDrive>& drives,
                       const ZoneRule& zone) {
     DecodeWindow window({request.from, request.to});
-    TimeSpan span{drives.front().recording.first, drives.front().recording.last};
+    TimeSpan span{drives.front().first, drives.front().last};
     for (const StoredDrive& drive : drives) {
-        span.end = std::max(*span.end, drive.recording.last);
+        span.end = std::max(*span.end, drive.last);
     }
     if (const auto refusal = window.open(span, zone)) {
         throw NoReport(*refusal);
@@ -126,7 +112,7 @@ const RecordedTechnology& technologyOf(std::vector<StoredDrive>& drives,
                                        const std::string& device) {
     std::set<std::string> all;
     for (const StoredDrive& drive : drives) {
-        all.insert(drive.technology);
+        all.insert(drive.loaded.technology);
     }
     if (request.technology == nullptr && all.size() > 1) {
         throw NoReport(formatText("The store has recordings of several technologies of %@ in that "
@@ -136,10 +122,11 @@ const RecordedTechnology& technologyOf(std::vector<StoredDrive>& drives,
     const std::string name = request.technology != nullptr
                                  ? std::string(request.technology->commandName)
                                  : (all.empty() ? "" : *all.begin());
-    std::erase_if(drives, [&name](const StoredDrive& each) { return each.technology != name; });
+    std::erase_if(drives,
+                  [&name](const StoredDrive& each) { return each.loaded.technology != name; });
     const RecordedTechnology* technology = technologyOfCommandName(name);
     if (drives.empty() || technology == nullptr) {
-        throw NoReport(formatText("The store has nothing of %@ in that time.", {device}));
+        throw NoReport(formatText(kNothing, {device}));
     }
     return *technology;
 }
@@ -149,7 +136,7 @@ void refuseTooMuch(const std::vector<StoredDrive>& drives) {
     constexpr std::chrono::days kMost{100};
     std::chrono::nanoseconds all{0};
     for (const StoredDrive& drive : drives) {
-        const auto length = drive.recording.last - drive.recording.first;
+        const auto length = drive.last - drive.first;
         if (length < std::chrono::nanoseconds(0) || length > kMost - all) {
             throw NoReport("The recordings of that time last more than 100 days, which is too much "
                            "for a page; choose less with --from and --to.");
@@ -161,17 +148,16 @@ void refuseTooMuch(const std::vector<StoredDrive>& drives) {
 /// Numbers packets through all drives, as of the parts of one recording.
 class StoredWalk {
 public:
-    StoredWalk(StoreConnection& store, FieldTable& fields, const DecodeWindow& window,
+    StoredWalk(StoredRecordings& store, FieldTable& fields, const DecodeWindow& window,
                ReportBuilder& report)
-        : _window(window), _report(report), _ticks(store, fields, _entries),
-          _find(store.prepare("SELECT time, packet, kind, words FROM events WHERE recording = ? "
-                              "ORDER BY rowid")) {}
+        : _store(store), _window(window), _report(report), _ticks(store, fields, _entries) {}
 
     void add(const StoredDrive& drive) {
-        _ticks.walk(drive.recording, [this](Time time, const CurrentValues& values,
-                                            std::uint64_t packet) { take(time, values, packet); });
+        _ticks.walk(drive, [this](Time time, const CurrentValues& values, std::uint64_t packet) {
+            take(time, values, packet);
+        });
         addEvents(drive);
-        _before += drive.packets;
+        _before += packetsOf(drive);
     }
     const std::vector<Event>& events() const { return _events; }
 
@@ -189,26 +175,19 @@ private:
         _isAfterStep = false;
     }
     void addEvents(const StoredDrive& drive) {
-        _find.bind(1, drive.recording.id);
-        while (_find.step()) {
-            const auto kind = eventKindNamed(_find.text(2));
-            const Time time = timeOf(_find.integer(0) / kMicroseconds) +
-                              std::chrono::microseconds(_find.integer(0) % kMicroseconds);
-            if (kind && _window.contains(time)) {
-                _events.push_back({*kind,
-                                   time,
-                                   _before + static_cast<std::uint64_t>(_find.integer(1)),
-                                   _find.text(3),
-                                   {}});
+        for (Event& event : _store.events(drive.loaded)) {
+            if (_window.contains(event.time)) {
+                event.packet += _before;
+                _events.push_back(std::move(event));
             }
         }
     }
 
+    StoredRecordings& _store;
     const DecodeWindow& _window;
     ReportBuilder& _report;
     EntryTable _entries;
     StoredTicks _ticks;
-    Statement _find;
     std::vector<Event> _events;
     std::uint64_t _before = 0; ///< packets of earlier drives
     std::optional<Time> _latest;
@@ -220,7 +199,7 @@ ReportHead headOf(const StoredReportRequest& request, const std::string& device,
                   const TechnologyReference& reference) {
     ReportHead head = request.head;
     head.label = head.label.empty() ? device : head.label;
-    head.recording = drives.size() == 1 ? drives.front().name
+    head.recording = drives.size() == 1 ? drives.front().loaded.name
                                         : counted(std::uint64_t{drives.size()}, "recording");
     head.technology = std::string(reference.title);
     head.notes.emplace_back(kWithoutDisplay);
@@ -228,21 +207,24 @@ ReportHead headOf(const StoredReportRequest& request, const std::string& device,
         head.notes.emplace_back(kWithoutContexts);
     }
     for (const StoredDrive& drive : drives) {
-        head.packets += drive.packets;
-        if (!drive.trouble.empty()) {
-            head.notes.push_back(drive.name + ": " + drive.trouble);
+        head.packets += packetsOf(drive);
+        if (drive.loaded.trouble) {
+            head.notes.push_back(drive.loaded.name + ": " + *drive.loaded.trouble);
         }
     }
     return head;
 }
 
-StoredReport reportOf(const StoredReportRequest& request, const StoredReportKnowledge& knowledge) {
-    const auto store = StoreConnection::openToRead(request.file);
-    const std::string device = deviceOf(*store, request);
-    std::vector<StoredDrive> drives = drivesOf(*store, device);
+StoredReport reportOf(StoredRecordings& store, const StoredReportRequest& request,
+                      const StoredReportKnowledge& knowledge) {
+    const std::string device = deviceOf(store, request);
+    std::vector<StoredDrive> drives = drivesOf(store, device);
+    if (drives.empty()) { // it has been replaced meanwhile
+        throw NoReport(formatText(kNothing, {device}));
+    }
     const DecodeWindow window = windowOf(request, drives, knowledge.zone);
     std::erase_if(drives, [&window](const StoredDrive& drive) {
-        return drive.recording.last < window.from() || drive.recording.first > window.to();
+        return drive.last < window.from() || drive.first > window.to();
     });
     const RecordedTechnology& technology = technologyOf(drives, request, device);
     refuseTooMuch(drives);
@@ -250,13 +232,13 @@ StoredReport reportOf(const StoredReportRequest& request, const StoredReportKnow
     // Identities are not in a store, at most their pseudonyms, which stay out as well.
     ReportBuilder report(knowledge.names, knowledge.profile,
                          [](const std::vector<std::string>& /*path*/) { return false; });
-    StoredWalk walk(*store, fields, window, report);
+    StoredWalk walk(store, fields, window, report);
     for (const StoredDrive& drive : drives) {
         walk.add(drive);
     }
     report.finish();
     if (report.ticks().empty()) {
-        throw NoReport(formatText("The store has nothing of %@ in that time.", {device}));
+        throw NoReport(formatText(kNothing, {device}));
     }
     const ReportHead head =
         headOf(request, device, drives, fields, gatherReference(technology, knowledge.resources));
@@ -269,14 +251,11 @@ StoredReport reportOf(const StoredReportRequest& request, const StoredReportKnow
 
 } // namespace
 
-Result<StoredReport, std::string> storedReport(const StoredReportRequest& request,
+Result<StoredReport, std::string> storedReport(const OpenRecordings& open,
+                                               const StoredReportRequest& request,
                                                const StoredReportKnowledge& knowledge) {
-    if (request.file.find("://") != std::string::npos) {
-        return formatText("\"%@\" is no file, and a report is drawn from the file of a store.",
-                          {request.file});
-    }
     try {
-        return reportOf(request, knowledge);
+        return reportOf(*open(), request, knowledge);
     } catch (const NoReport& none) {
         return std::string(none.what());
     } catch (const StoreFailure& failure) {

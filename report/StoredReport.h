@@ -1,11 +1,11 @@
 #pragma once
 
 #include "report/Figures.h"
+#include "store/StoredRecordings.h"
 #include "text/Date.h"
 #include "text/Result.h"
 #include "text/TimeText.h"
 
-#include <functional>
 #include <optional>
 #include <string>
 #include <vector>
@@ -19,7 +19,7 @@ struct RecordedTechnology;
 
 /// What a report of stored measurements is about.
 struct StoredReportRequest {
-    std::string file;                               ///< of the store
+    std::string store;                              ///< its file or address, for sentences
     std::optional<std::string> device;              ///< nothing: the only one
     const RecordedTechnology* technology = nullptr; ///< null: the only one of the device
     std::optional<TimeText> from = {};              ///< of what the store has of the device
@@ -41,8 +41,9 @@ struct StoredReport {
 };
 
 /// A report of the recordings of one device in a store, as of one recording. It says what a store
-/// does not hold. An error is a sentence.
-Result<StoredReport, std::string> storedReport(const StoredReportRequest& request,
+/// does not hold. An error is a sentence; `open` may throw StoreFailure.
+Result<StoredReport, std::string> storedReport(const OpenRecordings& open,
+                                               const StoredReportRequest& request,
                                                const StoredReportKnowledge& knowledge);
 
 } // namespace pallax

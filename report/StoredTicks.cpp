@@ -6,11 +6,13 @@
 #include "monitor/TickGrid.h"
 #include "packets/StampSequence.h"
 #include "report/ReportBuilder.h"
+#include "store/RecordingMeasurements.h"
 
 #include <algorithm>
 #include <chrono>
 #include <set>
 #include <string_view>
+#include <utility>
 
 namespace pallax {
 
@@ -70,19 +72,12 @@ Time storedTime(const StoredTicks::Recording& recording, std::int64_t after) {
 
 } // namespace
 
-StoredTicks::StoredTicks(StoreConnection& store, FieldTable& fields, EntryTable& entries)
-    : _fields(fields), _entries(entries), _values(fields, entries),
-      _intervals(store.prepare(
-          "SELECT s.entry, i.time, i.time + i.hold, i.packet, CASE typeof(i.number) WHEN 'integer' "
-          "THEN i.number * s.step ELSE i.number END AS held, CASE WHEN i.text IS NULL THEN "
-          "format(s.format, CASE typeof(i.number) WHEN 'integer' THEN i.number * s.step ELSE "
-          "i.number END) ELSE t.text END, t.raw FROM fields f CROSS JOIN series s ON s.field = "
-          "f.id "
-          "AND s.recording = ?2 CROSS JOIN intervals i ON i.id BETWEEN s.first_row AND s.last_row "
-          "LEFT JOIN texts t ON t.id = i.text WHERE f.name = ?1")) {
+StoredTicks::StoredTicks(StoredRecordings& store, FieldTable& fields, EntryTable& entries)
+    : _store(store), _fields(fields), _entries(entries), _values(fields, entries) {
     for (const std::string_view name : fieldsOfReport(fields.technology())) {
         if (const auto field = fields.named(name)) {
             _wanted.push_back(*field);
+            _names.emplace_back(name);
         }
     }
 }
@@ -99,48 +94,40 @@ void StoredTicks::walk(const Recording& recording, const Take& take) {
         });
         std::stable_sort(
             from, to, [](const Held& one, const Held& other) { return one.start < other.start; });
-        walkStretch({from, to},
-                    from->start +
-                        (recording.isOfPackets ? TickGrid::kInterval : std::chrono::nanoseconds(0)),
-                    take);
+        walkStretch(
+            {from, to},
+            from->start + (_isOfPackets ? TickGrid::kInterval : std::chrono::nanoseconds(0)), take);
         from = to;
     }
 }
 
 void StoredTicks::read(const Recording& recording) {
     _held.clear();
-    _isOfPackets = recording.isOfPackets;
-    for (const FieldIndex field : _wanted) {
-        _intervals.bind(1, _fields[field].name).bind(2, recording.id);
-        while (_intervals.step()) {
-            _held.push_back(readRow(field, recording));
-        }
-    }
+    _isOfPackets = recording.loaded.every == wordOf(Resolution::Packet);
+    _store.values(recording.loaded, _names, [&](std::size_t place, StoredValue value) {
+        _held.push_back(heldOf(_wanted[place], recording, std::move(value)));
+    });
     std::stable_sort(_held.begin(), _held.end(),
                      [](const Held& one, const Held& other) { return one.packet < other.packet; });
 }
 
-StoredTicks::Held StoredTicks::readRow(FieldIndex field, const Recording& recording) {
-    enum IntervalColumn : int { kEntry, kStart, kEnd, kPacket, kNumber, kText, kRaw };
+StoredTicks::Held StoredTicks::heldOf(FieldIndex field, const Recording& recording,
+                                      StoredValue value) {
     Held held{field,
               0,
               kNoEntry,
-              storedTime(recording, _intervals.integer(kStart)),
-              storedTime(recording, _intervals.integer(kEnd)),
-              static_cast<std::uint64_t>(_intervals.integer(kPacket)),
+              storedTime(recording, value.start),
+              storedTime(recording, value.end),
+              value.packet,
               {}};
-    if (!_intervals.isNull(kEntry)) {
+    if (value.entry) {
         held.list = listOf(field);
-        held.entry = _entries.entry(held.list, kNoEntry, _intervals.text(kEntry));
+        held.entry = _entries.entry(held.list, kNoEntry, *value.entry);
     }
     held.end = std::max(held.end, held.start);
-    held.value.shown = PropertyList(_intervals.text(kText));
-    if (!_intervals.isNull(kNumber)) {
-        held.value.number = _intervals.real(kNumber);
-    }
-    if (!_intervals.isNull(kRaw)) {
-        held.value.raw = _intervals.integer(kRaw);
-    }
+    held.value.shown = PropertyList(std::move(value.text));
+    held.value.number = value.number.value_or(held.value.number);
+    held.value.raw = value.raw;
     return held;
 }
 

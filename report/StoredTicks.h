@@ -1,12 +1,13 @@
 #pragma once
 
-#include "store/StoreConnection.h"
+#include "store/StoredRecordings.h"
 #include "timeline/CurrentValues.h"
 
 #include <cstddef>
 #include <cstdint>
 #include <functional>
 #include <map>
+#include <string>
 #include <utility>
 #include <vector>
 
@@ -17,13 +18,12 @@ namespace pallax {
 class StoredTicks {
 public:
     /// All must outlive it. The fields are those of the recordings' technology.
-    StoredTicks(StoreConnection& store, FieldTable& fields, EntryTable& entries);
+    StoredTicks(StoredRecordings& store, FieldTable& fields, EntryTable& entries);
 
     struct Recording {
-        std::int64_t id = 0;
+        LoadedRecording loaded;
         Time first;
-        Time last;                ///< nothing holds much longer
-        bool isOfPackets = false; ///< it has the values of each packet, not those of the ticks
+        Time last; ///< nothing holds much longer
     };
     /// Calls `take` at each tick at which something is known, with the values that are known then
     /// and the first packet of the stretch of time.
@@ -43,18 +43,19 @@ private:
     using Range = std::pair<std::vector<Held>::iterator, std::vector<Held>::iterator>;
 
     void read(const Recording& recording);
-    Held readRow(FieldIndex field, const Recording& recording);
+    Held heldOf(FieldIndex field, const Recording& recording, StoredValue value);
     ListId listOf(FieldIndex field);
     void walkStretch(const Range& stretch, Time tick, const Take& take);
     void show(Time tick);
     Time readAt(const Held& held, Time tick) const;
 
+    StoredRecordings& _store;
     FieldTable& _fields;
     EntryTable& _entries;
     CurrentValues _values;
-    Statement _intervals;
     std::vector<FieldIndex> _wanted;
-    bool _isOfPackets = false; ///< the recording
+    std::vector<std::string> _names; ///< of the wanted fields
+    bool _isOfPackets = false; ///< the recording has the values of each packet, not of the ticks
     std::vector<Held> _held;   ///< of the recording, in the order of packets
     std::map<std::pair<EntryId, FieldIndex>, const Held*> _current;
 };

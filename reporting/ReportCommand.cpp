@@ -4,6 +4,7 @@
 #include "decoding/DisplayJson.h"
 #include "decoding/StateCondition.h"
 #include "fields/Reference.h"
+#include "fleet/ServerRecordings.h"
 #include "host/Files.h"
 #include "masking/MaskedJournal.h"
 #include "masking/MaskedPlaces.h"
@@ -129,9 +130,10 @@ std::optional<ReportCommand::Part> ReportCommand::makeStoredPart(ExitStatus& sta
     request.head.title = _options.title;
     request.head.label = _options.labels.empty() ? "" : _options.labels.front();
     request.head.version = _environment.decoder.bundle.version().value_or("");
-    auto made = storedReport(request, {_environment.names, _environment.profile,
-                                       _environment.decoder.resources,
-                                       [&zone](Time time) { return zone.zone(time).offset; }});
+    auto made =
+        storedReport([this] { return openRecordings(_options.store); }, request,
+                     {_environment.names, _environment.profile, _environment.decoder.resources,
+                      [&zone](Time time) { return zone.zone(time).offset; }});
     if (!made) {
         _environment.report(made.error());
         status = kExitFailure;

@@ -3,6 +3,7 @@
 #include "console/Output.h"
 #include "decoding/InstalledKnowledge.h"
 #include "decoding/RequiredTemplates.h"
+#include "fleet/ServerRecordings.h"
 #include "host/AsioMainQueue.h"
 #include "host/BuildBundle.h"
 #include "host/Complaint.h"
@@ -128,9 +129,9 @@ ExitStatus serveStored(const WebOptions& options, const QualityProfile& profile)
     StoredReportRequest request{options.store, options.device, options.technology, options.from,
                                 options.to};
     request.head.version = BuildBundle().version().value_or("");
-    const auto report = storedReport(request, {names, profile, resources, [](Time time) {
-                                                   return WallClock().zone(time).offset;
-                                               }});
+    const auto report = storedReport(
+        [&options] { return openRecordings(options.store); }, request,
+        {names, profile, resources, [](Time time) { return WallClock().zone(time).offset; }});
     if (!report) {
         complain(report.error());
         return kExitFailure;

@@ -73,9 +73,9 @@ TEST_F(EndToEndReport, WhatCannotBeDrawnFromAStoreIsASentence) {
               "pallax: The store has no device \"car3\". Did you mean \"car1\"?\n");
     EXPECT_EQ(refusal({store, "--from", "2030-01-01"}),
               "pallax: The store has nothing of car1 in that time.\n");
-    EXPECT_EQ(refusal({"clickhouse://host/db"}),
-              "pallax: \"clickhouse://host/db\" is no file, and a report is drawn from the file of "
-              "a store.\n");
+    EXPECT_EQ(refusal({"clickhouse://host"}),
+              "pallax: \"clickhouse://host\" is not the address of a store, such as "
+              "clickhouse://host/database.\n");
     const Run itself = run({"report", "--store", store, "-o", store});
     EXPECT_EQ(itself.status, 1);
     EXPECT_EQ(itself.err, "pallax: " + store + " would be replaced by its report.\n");

@@ -2,6 +2,7 @@
 
 #include "decoding/DisplayJson.h"
 #include "report/ReportWalk.h"
+#include "store/FileRecordings.h"
 #include "store/FileStore.h"
 #include "tests/store/StoreFixture.h"
 
@@ -27,12 +28,13 @@ protected:
 
     StoredReportRequest whole() const {
         StoredReportRequest request;
-        request.file = file;
+        request.store = file;
         return request;
     }
     Result<StoredReport, std::string> made(const StoredReportRequest& request) const {
-        return storedReport(request, {_names, android(), resources,
-                                      [](Time /*time*/) { return std::chrono::seconds(0); }});
+        return storedReport(
+            [&] { return std::make_unique<FileRecordings>(request.store); }, request,
+            {_names, android(), resources, [](Time /*time*/) { return std::chrono::seconds(0); }});
     }
     Json figures(const StoredReportRequest& request) const {
         const auto report = made(request);
@@ -216,11 +218,8 @@ TEST_F(StoredReportTest, WhatCannotBeReportedIsASentence) {
     request.device = "car1";
     request.technology = technologyOfCommandName("gsm");
     EXPECT_EQ(refusal(request), "The store has nothing of car1 in that time.");
-    request.file = "clickhouse://host/db";
-    EXPECT_EQ(refusal(request), "\"clickhouse://host/db\" is no file, and a report is drawn from "
-                                "the file of a store.");
-    request.file = folder.write("other.db", "text");
-    EXPECT_EQ(refusal(request), request.file + " is no file of SQLite.");
+    request.store = folder.write("other.db", "text");
+    EXPECT_EQ(refusal(request), request.store + " is no file of SQLite.");
 }
 
 TEST_F(StoredReportTest, AGapOfWeeksIsPassedAtOnce) {

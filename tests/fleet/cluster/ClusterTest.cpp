@@ -29,6 +29,12 @@ protected:
         store = servers->address(1);
     }
 
+    Run report(const std::string& from, const std::vector<std::string>& words) const {
+        std::vector<std::string> arguments{"report", "--json", "-o", "-", "--store", from};
+        arguments.insert(arguments.end(), words.begin(), words.end());
+        return run(arguments);
+    }
+
     std::optional<PrivateServers> servers;
     std::string store;
     std::string file = world.path("store.db");
@@ -77,6 +83,48 @@ TEST_F(Cluster, AnswersAsAFileDoes) {
         const std::string expected = answer(file, words);
         EXPECT_EQ(answer(store, words), expected) << words.front();
         EXPECT_GT(std::count(expected.begin(), expected.end(), '\n'), 1) << words.front();
+    }
+}
+
+TEST_F(Cluster, AReportIsThatOfAFile) {
+    const std::string simulatedDrive = simulated("drive.pcap", 600, 5);
+    const std::string all = simulated("all.pcap", 120, 6);
+    for (const std::string& into : {file, store}) {
+        for (const auto& [device, path] : std::vector<std::pair<std::string, std::string>>{
+                 {"car1", drive},
+                 {"car1", sample("umts-drive.pcap")},
+                 {"it's \"2\"\\\n", simulatedDrive},
+                 {"car3", sample("gsm-attach.pcap")},
+                 {"car4", sample("cdma-drive.pcap")}}) {
+            const Run loaded = run({"store", "load", "--into", into, "--device", device, path});
+            EXPECT_EQ(loaded.status, 0) << loaded.err;
+        }
+        EXPECT_EQ(
+            run({"store", "load", "--into", into, "--device", "car5", "--every", "packet", all})
+                .status,
+            0);
+    }
+    for (const std::vector<std::string>& words : std::vector<std::vector<std::string>>{
+             {"--device", "car1", "--technology", "lte"},
+             {"--device", "it's \"2\"\\\n"},
+             {"--device", "it's \"2\"\\\n", "--from", "+5m", "--to", "-1m"},
+             {"--device", "car3"},
+             {"--device", "car4"},
+             {"--device", "car5"}}) {
+        SCOPED_TRACE(words[1]);
+        const Run expected = report(file, words);
+        EXPECT_EQ(expected.status, 0) << expected.err;
+        EXPECT_GT(expected.out.size(), 1000U);
+        const Run made = report(store, words);
+        EXPECT_EQ(made.status, 0) << made.err;
+        EXPECT_EQ(made.out, expected.out);
+    }
+    for (const std::vector<std::string>& words :
+         std::vector<std::vector<std::string>>{{}, {"--device", "car9"}, {"--device", "car1"}}) {
+        const Run made = report(store, words);
+        EXPECT_EQ(made.status, 1);
+        EXPECT_EQ(made.err, report(file, words).err);
+        EXPECT_EQ(made.out, "");
     }
 }
 
