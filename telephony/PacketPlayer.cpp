@@ -14,6 +14,8 @@ namespace {
 constexpr std::size_t kChunkSize = std::size_t{64} << 10U;
 /// Unwanted packets write nothing; after this many, other blocks get their turn.
 constexpr int kPacketsPerStep = 1000;
+/// Waking up costs more than sending a packet: those that are due within this time go together.
+constexpr std::chrono::milliseconds kLeastWait{4};
 
 std::chrono::nanoseconds scaled(std::chrono::nanoseconds time, double factor) {
     constexpr double kLongest = 1e18; // about 30 years
@@ -144,7 +146,8 @@ PacketPlayer::Progress PacketPlayer::waitUntilDue(Time time) {
         return Progress::Wait;
     }
     if (delay <= kClockInterval) {
-        _setup.queue.after(delay, guarded(&PacketPlayer::step));
+        _setup.queue.after(std::max<std::chrono::nanoseconds>(delay, kLeastWait),
+                           guarded(&PacketPlayer::step));
         return Progress::Wait;
     }
     _setup.queue.after(kClockInterval, guarded(&PacketPlayer::tellRunningTime));

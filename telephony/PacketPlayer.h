@@ -32,11 +32,11 @@ struct PlayOptions {
 /// Plays a source into a sink at the pace of the stamps. The player drops nothing: it sends one
 /// chunk at a time, so a sink that waits for its receiver slows the player down.
 ///
-/// Every packet carries its source time. The first packet's time is sent before everything else,
-/// even if that packet is not wanted. While no packet is due, the current time is sent at least
-/// every half second. After the last packet come the time of the next display tick and End. When
-/// the stamps step back, playing continues at once. A remark about an odd stamp precedes its
-/// packet, wanted or not.
+/// Every packet carries its source time, and may come a few milliseconds late. The first packet's
+/// time is sent before everything else, even if that packet is not wanted. While no packet is due,
+/// the current time is sent at least every half second. After the last packet come the time of the
+/// next display tick and End. When the stamps step back, playing continues at once. A remark about
+/// an odd stamp precedes its packet, wanted or not.
 class PacketPlayer {
 public:
     using SteadyNow = std::function<std::chrono::steady_clock::time_point()>;

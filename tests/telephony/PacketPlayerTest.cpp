@@ -146,6 +146,13 @@ TEST_F(PacketPlayerTest, KeepsTheSourcesTimingAndReachesTheTickAfterTheLastPacke
     EXPECT_EQ(_ended, (std::vector<std::string>{""}));
 }
 
+TEST_F(PacketPlayerTest, PacketsThatAreSoonDueGoTogether) {
+    play({{0ms, 1}, {1ms, 2}, {2ms, 3}, {4ms, 4}, {9ms, 5}});
+    _queue.advance(20ms);
+    EXPECT_EQ(_sink.diary, (Diary{"0: clock at 0", "0: packet 1 at 0", "4: packet 2 at 1",
+                                  "4: packet 3 at 2", "4: packet 4 at 4", "9: packet 5 at 9"}));
+}
+
 TEST_F(PacketPlayerTest, TheSourceIsToldWhatIsWanted) {
     play({{0ms, 1}});
     EXPECT_EQ(_source->selected, (std::vector<std::string>{"with 5"})) << "before it is requested";
