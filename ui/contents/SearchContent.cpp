@@ -44,8 +44,7 @@ void SearchContent::findInstants(TableModel& table) {
     _instants = _surroundings.finder.instants(_text);
     _isSearching = false;
     const std::chrono::seconds ahead = _surroundings.ahead();
-    TableContent content{
-        {{"Time", {}, true}, {"Name"}, {"Value"}, {"Where"}}, {}, "hit", "hits"};
+    TableContent content{{{"Time", {}, true}, {"Name"}, {"Value"}, {"Where"}}, {}, "hit", "hits"};
     _isCut = _instants.hits.size() > TextFinder::kMostHits;
     const std::size_t count = std::min(_instants.hits.size(), TextFinder::kMostHits);
     for (std::size_t index = 0; index < count; ++index) {

@@ -110,9 +110,8 @@ PageTable::Copy FrontEnd::copier() {
 }
 
 void FrontEnd::openEvents() {
-    _pages.open(EventsPage({{_surroundings.moment, _surroundings.ahead, wording()},
-                            _surroundings.goTo,
-                            copier()}));
+    _pages.open(EventsPage(
+        {{_surroundings.moment, _surroundings.ahead, wording()}, _surroundings.goTo, copier()}));
     needsDisplay();
 }
 
