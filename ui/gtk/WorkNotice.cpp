@@ -32,7 +32,8 @@ void WorkNotice::during(const std::function<void()>& work) {
 
 bool WorkNotice::mayGoOn(const std::string& words) {
     const auto now = _now();
-    if (!_isWorking || now - _began < kSilentWork || now - _looked < kBetweenLooks) {
+    const bool isSilent = now - _began < kSilentWork || now - _looked < kBetweenLooks;
+    if (!_isWorking || _isStopped || isSilent) {
         return !_isStopped;
     }
     if (_dialog == nullptr) {
