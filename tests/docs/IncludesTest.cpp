@@ -70,7 +70,7 @@ const std::vector<Layer>& layers() {
           "query", "host"}},
         {"fleet", {"text", "fields", "query", "host", "timeline", "store"}},
         {"travel", {"text", "packets", "platform/ui", "app", "timeline", "query"}},
-        {"ui/contents", {"text", "app/table", "timeline", "query"}},
+        {"ui/contents", {"text", "app/pane", "app/table", "timeline", "query"}},
         {"ui/drawing", {"text", "platform/ui", "app/pane", "app/table", "knowledge", "timeline"}},
         {"ui/curses", {"text", "ui/drawing"}},
         {"ui/pages",

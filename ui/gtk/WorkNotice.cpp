@@ -51,6 +51,7 @@ bool WorkNotice::mayGoOn(const std::string& words) {
 void WorkNotice::open(const std::string& words) {
     if (GtkWidget* focus = gtk_window_get_focus(_window)) {
         _focus = shared(focus);
+        gtk_window_set_focus(_window, nullptr);
     }
     gtk_widget_set_sensitive(gtk_widget_get_first_child(GTK_WIDGET(_window)), FALSE);
     _dialog = ADW_MESSAGE_DIALOG(
@@ -72,7 +73,11 @@ void WorkNotice::close() {
     _dialog = nullptr;
     gtk_widget_set_sensitive(gtk_widget_get_first_child(GTK_WIDGET(_window)), TRUE);
     if (const Ref<GtkWidget> focus = std::move(_focus)) {
-        gtk_widget_grab_focus(focus.get());
+        if (GTK_IS_TEXT(focus.get()) != FALSE) {
+            gtk_text_grab_focus_without_selecting(GTK_TEXT(focus.get()));
+        } else {
+            gtk_widget_grab_focus(focus.get());
+        }
     }
 }
 
