@@ -41,6 +41,8 @@ void SearchView::buildFields() {
     gtk_box_set_homogeneous(GTK_BOX(scopes), TRUE);
     for (GtkToggleButton* each : {_frame, _recording}) {
         gtk_widget_set_hexpand(GTK_WIDGET(each), TRUE);
+        gtk_label_set_ellipsize(GTK_LABEL(gtk_button_get_child(GTK_BUTTON(each))),
+                                PANGO_ELLIPSIZE_END); // a long word does not widen the window
         gtk_box_append(GTK_BOX(scopes), GTK_WIDGET(each));
     }
     gtk_toggle_button_set_group(_recording, _frame);
