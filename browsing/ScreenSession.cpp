@@ -1,9 +1,7 @@
 #include "browsing/ScreenSession.h"
 
-#include "host/BoundedJournal.h"
 #include "link/Settings.h"
 #include "platform/ZoneText.h"
-#include "querying/QueryHistory.h"
 
 #include <utility>
 
@@ -90,32 +88,12 @@ terminal::FrontEnd::Surroundings ScreenSession::frontEndSurroundings() {
                     _screen.needsDisplay();
                 },
             .mayGoOn = [this] { return mayGoOn("Working. Esc stops."); },
-            .queries = querySeams(),
+            .queries = _viewer.querySeams(),
             .ahead = [this, ahead] { return ahead(_viewer.now()); },
             .travel = &_viewer.travel(),
             .chooseModem = _screen.chooseModem,
             .profile = [this]() -> const QualityProfile& { return _screen.profile; },
             .switchSafe = _screen.switchSafe};
-}
-
-/// The history is that of the shell of `pallax sql`, where a query ends in ";" and other lines are
-/// commands, which begin with ".".
-terminal::QuerySeams ScreenSession::querySeams() {
-    return {.earlier =
-                [] {
-                    auto lines = QueryHistory(BoundedJournal::stateFolder()).load();
-                    std::erase_if(lines, [](const auto& line) { return line.starts_with('.'); });
-                    return lines;
-                },
-            .remember =
-                [](const std::string& query) {
-                    (void)QueryHistory(BoundedJournal::stateFolder())
-                        .add(query.ends_with(';') ? query : query + ';');
-                },
-            .addFunctions =
-                [this](Database& database, Timeline& timeline) {
-                    pallax::addFunctions(database, _viewer.knowledge(), &timeline.fields());
-                }};
 }
 
 } // namespace pallax

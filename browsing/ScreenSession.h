@@ -58,7 +58,6 @@ private:
     ViewerSession::Face face();
     terminal::FrontEnd::Surroundings frontEndSurroundings();
     bool mayGoOn(const std::string& words);
-    terminal::QuerySeams querySeams();
 
     const Screen& _screen;
     ViewerSession _viewer;

@@ -1,9 +1,11 @@
 #include "browsing/ViewerSession.h"
 
+#include "host/BoundedJournal.h"
 #include "host/KnowledgeFiles.h"
 #include "host/Snapshot.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
+#include "querying/QueryHistory.h"
 #include "text/Format.h"
 #include "timeline/Timeline.h"
 
@@ -182,6 +184,26 @@ QueryKnowledge ViewerSession::knowledge() {
                 auto profile = loadProfile(name, profileFolder());
                 return profile ? std::optional(std::move(profile).value()) : std::nullopt;
             }};
+}
+
+/// The history is that of the shell of `pallax sql`, where a query ends in ";" and other lines are
+/// commands, which begin with ".".
+QuerySeams ViewerSession::querySeams() {
+    return {.earlier =
+                [] {
+                    auto lines = QueryHistory(BoundedJournal::stateFolder()).load();
+                    std::erase_if(lines, [](const auto& line) { return line.starts_with('.'); });
+                    return lines;
+                },
+            .remember =
+                [](const std::string& query) {
+                    (void)QueryHistory(BoundedJournal::stateFolder())
+                        .add(query.ends_with(';') ? query : query + ';');
+                },
+            .addFunctions =
+                [this](Database& database, Timeline& timeline) {
+                    pallax::addFunctions(database, knowledge(), &timeline.fields());
+                }};
 }
 
 const NetworkNames& ViewerSession::names() {

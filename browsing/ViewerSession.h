@@ -15,6 +15,7 @@
 #include "overview/StatusWatch.h"
 #include "platform/Clock.h"
 #include "travel/Travel.h"
+#include "ui/contents/QueryContent.h"
 #include "watching/AlarmWatch.h"
 
 #include <cstdint>
@@ -103,6 +104,7 @@ public:
     EntryPart entryPart(const std::string& path) const;
     const NetworkNames& names();
     QueryKnowledge knowledge();
+    QuerySeams querySeams();
 
 private:
     BrowsingSession::Surroundings sessionSurroundings(ui::Toolkit& toolkit);

@@ -76,6 +76,7 @@ private:
             {{"overview", gtk::translated("Overview"), [this] { _frame.toggleDetail(); }},
              {"search", gtk::translated("Search Rows"), [this] { _frame.toggleSearch(); }},
              {"time", gtk::translated("Time Bar"), onSession(&WindowSession::toggleTimeBar)}},
+            _session->tablePages().menu(),
             {{"safe", gtk::translated("Hide Identities"), onSession(&WindowSession::toggleSafe),
               [this] { return _session && _session->isSafe(); }},
              {"afresh", gtk::translated("Start Afresh"), onSession(&WindowSession::startAfresh)}},

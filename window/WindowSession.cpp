@@ -32,8 +32,23 @@ WindowSession::WindowSession(Setup setup)
                                                    .source = setup.request.options.source,
                                                    .face = face()}),
       _instant(_viewer.travel(), _toolkit), _timeBar(setup.guard, timeActions()),
-      _profile(setup.request.profile), _values(valueSource()) {
+      _profile(setup.request.profile), _values(valueSource()),
+      _work(setup.frame.window(), setup.guard),
+      _tables({.frame = setup.frame,
+               .guard = setup.guard,
+               .viewer = _viewer,
+               .work = _work,
+               .goTo = [this](std::uint64_t packet) {
+                   travel([packet](Travel& to) { return to.toInstant(packet); });
+               }}) {
     gtk_widget_set_visible(_timeBar.widget(), FALSE);
+    _toolkit.lists() = {.asTables = setup.request.settings.lists == Lists::Table,
+                        .partAt = [this](const auto& path) { return _viewer.entryPart(path); },
+                        .ageAt =
+                            [this](const auto& path) {
+                                _values.update();
+                                return _values.ageAt(path);
+                            }};
     _viewer.attach(_toolkit);
     _frame.onLeaf([this](const auto& path, const auto& text) { openValue(path, text); });
     _frame.setDetail(_overview.widget(), gtk::translated("Overview"));
@@ -66,8 +81,9 @@ ViewerSession::Face WindowSession::face() {
                 [this] {
                     forgetInstant();
                     _values.forget();
+                    _tables.forgetTimeline();
                 },
-            .mayGoOn = [](const auto& /*words*/) { return true; }};
+            .mayGoOn = [this](const auto& words) { return _work.mayGoOn(words); }};
 }
 
 /// Comes also while there are no packets, when ages grow.
@@ -77,6 +93,7 @@ void WindowSession::tick() {
     }
     showTimeBar();
     showValue();
+    _tables.refresh();
 }
 
 terminal::ShownValues::Source WindowSession::valueSource() {
@@ -99,7 +116,7 @@ void WindowSession::openValue(const std::string& path, const std::string& text) 
 }
 
 void WindowSession::showValue() {
-    if (_frame.isPageOpen()) {
+    if (_frame.isPageOpen(_value.widget())) {
         _value.show(shownValue(_values, _valuePath, _valueText));
     }
 }
@@ -135,9 +152,11 @@ void WindowSession::wish(Wish wish) {
 }
 
 void WindowSession::travel(const std::function<Travel::Refusal(Travel&)>& action) {
-    if (const Travel::Refusal refusal = action(_viewer.travel())) {
-        _frame.setMessage(*refusal);
-    }
+    _work.during([&] {
+        if (const Travel::Refusal refusal = action(_viewer.travel())) {
+            _frame.setMessage(*refusal);
+        }
+    });
     gtk_widget_set_visible(_timeBar.widget(), TRUE);
     showInstant();
     _viewer.tellTrouble();
@@ -162,6 +181,7 @@ void WindowSession::showInstant() {
     }
     _overview.show(_viewer.overview());
     showTimeBar();
+    _tables.refresh();
 }
 
 /// The live panes come back before those of the instant go.
@@ -211,6 +231,7 @@ void WindowSession::toggleSafe() {
     }
     _isSafe = !_isSafe;
     forgetInstant();
+    _tables.forget();
     _viewer.setSafe(_isSafe);
     _overview.show(_viewer.overview());
 }
@@ -237,7 +258,7 @@ bool WindowSession::handleKey(guint key) {
         wish(Wish::ToPresent);
         return true;
     default:
-        return false;
+        return _tables.handleKey(key);
     }
 }
 

@@ -9,6 +9,7 @@
 #include "ui/gtk/ValueView.h"
 #include "ui/gtk/WidgetToolkit.h"
 #include "ui/pages/ShownValues.h"
+#include "window/TablePages.h"
 
 #include <functional>
 #include <memory>
@@ -42,6 +43,7 @@ public:
 
     gtk::OverviewView& overview() { return _overview; }
     gtk::TimeBar& timeBar() { return _timeBar; }
+    TablePages& tablePages() { return _tables; }
     /// Shows the time bar, or no longer, and then the present.
     void toggleTimeBar();
     void startAfresh() { _viewer.startAfresh(); }
@@ -79,6 +81,8 @@ private:
     std::string _valuePath;                   ///< of the value that its page shows
     std::string _valueText;                   ///< of its row, when the page was opened
     std::unique_ptr<RepeatingTimer> _playing; ///< while time plays
+    gtk::WorkNotice _work;
+    TablePages _tables;
 };
 
 } // namespace pallax

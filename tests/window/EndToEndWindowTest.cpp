@@ -96,6 +96,33 @@ TEST_F(EndToEndWindow, TimeIsHeldSteppedAndReleased) {
                        "press 'To the present' lacks '22:15:18, held*' has Hold"));
 }
 
+TEST_F(EndToEndWindow, EventsHitsAndAnswersAreTablesThatGoToTheirInstant) {
+    expectDriven(
+        drive(sample("lte-drive.pcap") + " --speed max",
+              "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key e "
+              "open 'Time 22:15:14, Kind cell-change, What serving cell 82 → 286 after 17 s' "
+              "has '22:15:15, held*' focus 'SIM Info' key ';' "
+              "type 'Question in SQL=select packet, kind from event order by packet' key Return "
+              "press 'packet' press 'packet, sorted, least first' "
+              "has 'packet, sorted, greatest first' open 'packet 93, kind context-up' "
+              "has '22:13:29, held*' focus 'SIM Info' key f "
+              "type 'Find a text in names and values=context down' "
+              "has 'Nothing in this instant contains this text.' "
+              "press 'Whole Recording' has 'Time 22:13:53, Name context-down*' "
+              "key Escape lacks 'Whole Recording' press 'To the present' "
+              "open 'SIM Info'"));
+}
+
+TEST_F(EndToEndWindow, AListIsATableWithColumns) {
+    expectDriven(
+        drive(sample("lte-drive.pcap") + " --speed max",
+              "has 'Updated 2023-11-14 at 22:15:20' open 'Neighbor Cells List, 2' "
+              "press 'Show as Table' has 'Physical Cell ID 184, Measured RSSI -64.00 dBm*' "
+              "press 'Measured RSRP dBm' "
+              "open 'Physical Cell ID 285, *' has 'Physical Cell ID: 285' key Escape "
+              "press 'Show as Rows' lacks 'Physical Cell ID 184, *'"));
+}
+
 TEST_F(EndToEndWindow, SpeaksGermanButKeepsTheModemsTexts) {
     if (!std::filesystem::exists(PALLAX_BINARY_DIR "/locale")) {
         GTEST_SKIP() << "gettext is not installed";

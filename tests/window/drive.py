@@ -6,7 +6,7 @@
   press NAME       presses the button with this name
   open NAME        goes to the row with this name by keys, and presses Enter
   focus NAME       goes to it
-  key KEY          presses a key: Escape, Right
+  key KEY          presses a key: Escape, Right, e
   type NAME=TEXT   puts the text into the field with this name
   tree             prints all names
 
@@ -84,7 +84,8 @@ def tree():
 
 
 def press_key(name):
-    Atspi.generate_keyboard_event(KEYS[name], None, Atspi.KeySynthType.SYM)
+    symbol = ord(name) if len(name) == 1 else KEYS[name]
+    Atspi.generate_keyboard_event(symbol, None, Atspi.KeySynthType.SYM)
 
 
 def has_focus(node):

@@ -1,5 +1,6 @@
 #include "ui/drawing/ColumnTable.h"
 
+#include "app/table/TableColumns.h"
 #include "ui/drawing/MarkedText.h"
 #include "ui/drawing/TextWidth.h"
 
@@ -15,22 +16,6 @@ constexpr int kColumnGap = 2; // the first of them is for a mark
 constexpr int kLeastOfText = 8;
 constexpr int kMostHeadingRows = 2;
 constexpr int kRowsForTwoHeadingRows = 6;
-
-/// One or two lines of a heading, as narrow as possible.
-std::vector<std::string> narrowed(const std::string& text) {
-    std::vector<std::string> best{text};
-    int width = columnsOf(text);
-    for (std::size_t blank = text.find(' '); blank != std::string::npos;
-         blank = text.find(' ', blank + 1)) {
-        std::vector<std::string> lines{text.substr(0, blank), text.substr(blank + 1)};
-        const int wider = std::max(columnsOf(lines[0]), columnsOf(lines[1]));
-        if (wider < width) {
-            width = wider;
-            best = std::move(lines);
-        }
-    }
-    return best;
-}
 
 int widthOfLines(const std::vector<std::string>& lines) {
     int width = 0;
@@ -112,23 +97,7 @@ bool ColumnTable::scrollSideways(int columns) {
 }
 
 bool ColumnTable::handleColumnKey(char32_t character) {
-    switch (character) {
-    case U'<':
-        _model.choosePrevious();
-        break;
-    case U'>':
-        _model.chooseNext();
-        break;
-    case U'r':
-        _model.reverse();
-        break;
-    case U'x':
-        _model.hideChosen();
-        break;
-    case U'X':
-        _model.showAllColumns();
-        break;
-    default:
+    if (!pallax::handleColumnKey(_model, character)) {
         return false;
     }
     revealChosen();
@@ -183,26 +152,19 @@ void ColumnTable::measure() const {
     const TableContent& content = _model.content();
     _measured.assign(content.columns.size(), {});
     for (std::size_t column = 0; column < content.columns.size(); ++column) {
-        bool hasNumbers = false;
-        bool hasTexts = false;
         for (const TableRow& row : content.rows) {
-            const TableCell& cell = row.cells[column];
-            _measured[column].width = std::max(_measured[column].width, columnsOf(cell.text));
-            const bool isNumber = cell.number || cell.opens;
-            hasNumbers = hasNumbers || isNumber;
-            hasTexts = hasTexts || (!isNumber && !cell.text.empty());
+            _measured[column].width =
+                std::max(_measured[column].width, columnsOf(row.cells[column].text));
         }
-        _measured[column].isRight = hasNumbers && !hasTexts;
+        _measured[column].isRight = isFlushRight(content, column);
     }
 }
 
 std::vector<std::string> ColumnTable::headingOf(std::size_t column) const {
-    const TableColumn& described = _model.content().columns[column];
-    std::string text = described.name;
-    text.append(described.unit.empty() ? "" : " ").append(described.unit);
+    std::string text = pallax::headingOf(_model.content().columns[column]);
     const bool isOneLine =
         _rows < kRowsForTwoHeadingRows || columnsOf(text) <= _measured[column].width;
-    return isOneLine ? std::vector<std::string>{text} : narrowed(text);
+    return isOneLine ? std::vector<std::string>{std::move(text)} : narrowed(text, columnsOf);
 }
 
 int ColumnTable::widthOf(std::size_t column) const {
@@ -336,7 +298,7 @@ void ColumnTable::drawHeadings(const Brush& brush, const std::vector<Place>& pla
             brush.grid.put(std::min(place.x + end, clip.right), top + rows - 1, mark, style);
         }
         brush.hits.add(place.x, top, place.width + 1, rows, [this, column = place.column] {
-            _model.chosenColumn() == column ? _model.reverse() : _model.choose(column);
+            pressHeading(_model, column);
             keepCursorInWindow();
         });
     }

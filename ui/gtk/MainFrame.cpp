@@ -33,8 +33,13 @@ MainFrame::MainFrame(GtkApplication* application, const Guard& guard, Actions ac
       _title(ADW_WINDOW_TITLE(adw_window_title_new("Pallax", ""))),
       _back(GTK_BUTTON(gtk_button_new_from_icon_name("go-previous-symbolic"))),
       _oldValues(GTK_LABEL(gtk_label_new(nullptr))), _panes(ADW_BIN(adw_bin_new())),
-      _searchBar(GTK_SEARCH_BAR(gtk_search_bar_new())),
-      _search(GTK_SEARCH_ENTRY(gtk_search_entry_new())),
+      _filter(_guard,
+              [this](const std::string& text) {
+                  if (_stack != nullptr) {
+                      widgetTable(_stack->top().table()).setFilter(text);
+                  }
+              }),
+      _lists(GTK_BUTTON(gtk_button_new())),
       _bars(GTK_BOX(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0))),
       _toolbar(GTK_BOX(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 8))),
       _spinner(GTK_SPINNER(gtk_spinner_new())), _status(GTK_LABEL(gtk_label_new(nullptr))),
@@ -59,6 +64,8 @@ void MainFrame::build() {
     nameWidget(GTK_WIDGET(_back), translated("Back"));
     gtk_widget_set_visible(GTK_WIDGET(_back), FALSE);
     adw_header_bar_pack_start(_header, GTK_WIDGET(_back));
+    adw_header_bar_pack_start(_header, GTK_WIDGET(_lists));
+    gtk_widget_set_visible(GTK_WIDGET(_lists), FALSE);
     adw_header_bar_set_title_widget(_header, GTK_WIDGET(_title));
     gtk_widget_add_css_class(GTK_WIDGET(_oldValues), "pallax-banner");
     gtk_label_set_wrap(_oldValues, TRUE);
@@ -66,8 +73,7 @@ void MainFrame::build() {
     gtk_widget_set_vexpand(GTK_WIDGET(_panes), TRUE);
 
     GtkWidget* page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
-    buildSearch();
-    for (GtkWidget* child : {GTK_WIDGET(_header), GTK_WIDGET(_searchBar), GTK_WIDGET(_oldValues),
+    for (GtkWidget* child : {GTK_WIDGET(_header), _filter.widget(), GTK_WIDGET(_oldValues),
                              GTK_WIDGET(_panes), GTK_WIDGET(_bars), buildToolbar()}) {
         gtk_box_append(GTK_BOX(page), child);
     }
@@ -107,6 +113,7 @@ GtkWidget* MainFrame::buildToolbar() {
 void MainFrame::listen() {
     onSignal(_back, "clicked", _guard, [this] { back(); });
     onSignal(_save, "clicked", _guard, [this] { _saveAction(); });
+    onSignal(_lists, "clicked", _guard, [this] { switchLists(); });
     connect(_window.get(), "close-request", _guard, std::function<gboolean()>([this]() -> gboolean {
                 _guard.queue().async(_actions.closed);
                 return TRUE; // the window goes with the program
@@ -185,30 +192,20 @@ void MainFrame::addBar(GtkWidget* bar) {
     gtk_box_append(_bars, bar);
 }
 
-void MainFrame::buildSearch() {
-    gtk_search_bar_set_child(_searchBar, GTK_WIDGET(_search));
-    gtk_search_bar_connect_entry(_searchBar, GTK_EDITABLE(_search));
-    gtk_widget_set_hexpand(GTK_WIDGET(_search), TRUE);
-    nameWidget(GTK_WIDGET(_search), translated("Show rows that contain a text"));
-    onSignal(_search, "search-changed", _guard, [this] { filter(); });
-    onSignal(_searchBar, "notify::search-mode-enabled", _guard, [this] {
-        if (gtk_search_bar_get_search_mode(_searchBar) == FALSE) {
-            gtk_editable_set_text(GTK_EDITABLE(_search), "");
-            filter();
-        }
-    });
-}
-
-/// Filters the topmost pane.
-void MainFrame::filter() {
-    if (_stack != nullptr) {
-        widgetTable(_stack->top().table()).setFilter(gtk_editable_get_text(GTK_EDITABLE(_search)));
+void MainFrame::toggleSearch() {
+    if (_page == nullptr) {
+        _filter.toggle();
+    } else if (_pageFilter) {
+        _pageFilter->toggle();
     }
 }
 
-void MainFrame::toggleSearch() {
-    const bool isOpen = gtk_search_bar_get_search_mode(_searchBar) != FALSE;
-    gtk_search_bar_set_search_mode(_searchBar, isOpen ? FALSE : TRUE);
+void MainFrame::switchLists() {
+    if (_stack == nullptr || !widgetTable(_stack->top().table()).isListWithColumns()) {
+        return setMessage(translated("Nothing to show as a table: choose a list."));
+    }
+    widgetTable(_stack->top().table()).switchLook();
+    refresh();
 }
 
 void MainFrame::setMenu(GtkWidget* button) {
@@ -227,6 +224,16 @@ void MainFrame::refresh() {
     const bool hasToolbar = _stack == _live && _stack->isToolbarShown();
     gtk_widget_set_visible(GTK_WIDGET(_toolbar), hasToolbar ? TRUE : FALSE);
     showToolbarItems(_stack->top().toolbarItems());
+    showListButton();
+}
+
+void MainFrame::showListButton() {
+    const WidgetTable& table = widgetTable(_stack->top().table());
+    const bool isTable = table.isShownAsTable();
+    gtk_button_set_icon_name(_lists, isTable ? "view-list-symbolic" : "view-grid-symbolic");
+    nameWidget(GTK_WIDGET(_lists),
+               isTable ? translated("Show as Rows") : translated("Show as Table"));
+    gtk_widget_set_visible(GTK_WIDGET(_lists), table.isListWithColumns() ? TRUE : FALSE);
 }
 
 /// The widgets stay, so that the focus stays on the button.
@@ -263,7 +270,8 @@ void MainFrame::modalChanged() {
     }
 }
 
-void MainFrame::openPage(GtkWidget* widget, const std::string& title) {
+void MainFrame::openPage(GtkWidget* widget, const std::string& title,
+                         std::function<void(const std::string& text)> filter) {
     closePage();
     GtkWidget* header = adw_header_bar_new();
     GtkWidget* backButton = gtk_button_new_from_icon_name("go-previous-symbolic");
@@ -274,6 +282,10 @@ void MainFrame::openPage(GtkWidget* widget, const std::string& title) {
                                     adw_window_title_new(shownText(title).c_str(), ""));
     _page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
     gtk_box_append(GTK_BOX(_page), header);
+    if (filter) {
+        _pageFilter.emplace(_guard, std::move(filter));
+        gtk_box_append(GTK_BOX(_page), _pageFilter->widget());
+    }
     gtk_box_append(GTK_BOX(_page), widget);
     gtk_stack_add_named(_pages, _page, kOpenedPage);
     gtk_stack_set_visible_child_name(_pages, kOpenedPage);
@@ -286,6 +298,7 @@ void MainFrame::closePage() {
         gtk_box_remove(GTK_BOX(_page), gtk_widget_get_last_child(_page));
         gtk_stack_set_visible_child_name(_pages, kPanesPage);
         gtk_stack_remove(_pages, std::exchange(_page, nullptr));
+        _pageFilter.reset();
     }
 }
 

@@ -2,6 +2,7 @@
 
 #include "platform/ui/Geometry.h"
 #include "platform/ui/Views.h"
+#include "ui/gtk/FilterBar.h"
 #include "ui/gtk/PangoMetrics.h"
 #include "ui/gtk/Ref.h"
 #include "ui/gtk/Signals.h"
@@ -9,6 +10,7 @@
 
 #include <adwaita.h>
 #include <functional>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -62,6 +64,8 @@ public:
     void toggleDetail();
     /// The panes of another instant, in place of the live ones; null: the live ones.
     void setHeldStack(WidgetNavigation* stack);
+    /// The panes that are shown.
+    WidgetNavigation* shownStack() const { return _stack; }
     /// The panes whose application lives.
     WidgetNavigation* liveStack() const { return _live; }
     /// Below the panes.
@@ -70,15 +74,23 @@ public:
     void onKey(std::function<bool(guint key, GdkModifierType state)> action) {
         _key = std::move(action);
     }
+    /// The field that filters what is seen: the topmost pane, or the page.
     void toggleSearch();
+    /// Shows lists as tables, or as rows; says so where there is no list.
+    void switchLists();
     /// A row with a value was selected.
     void onLeaf(std::function<void(const std::string& path, const std::string& text)> action) {
         _leaf = std::move(action);
     }
     void leafSelected(const std::string& path, const std::string& text) { _leaf(path, text); }
-    /// A page over the panes, until the user goes back.
-    void openPage(GtkWidget* widget, const std::string& title);
+    /// A page over the panes, until the user goes back. `filter` shows only what contains a text,
+    /// for pages that can.
+    void openPage(GtkWidget* widget, const std::string& title,
+                  std::function<void(const std::string& text)> filter = nullptr);
     bool isPageOpen() const { return _page != nullptr; }
+    bool isPageOpen(GtkWidget* widget) const {
+        return _page != nullptr && gtk_widget_get_parent(widget) == _page;
+    }
     void closePage();
 
 private:
@@ -86,10 +98,9 @@ private:
     void listen();
     GtkWidget* buildToolbar();
     void adopt(WidgetNavigation* stack);
-    void buildSearch();
-    void filter();
     void showToolbarItems(const ui::BarItems& items);
     void showRemarks();
+    void showListButton();
     void back();
     gboolean handleKey(guint key, guint code, GdkModifierType state);
 
@@ -108,9 +119,10 @@ private:
     GtkButton* _back;
     GtkLabel* _oldValues;
     AdwBin* _panes;
-    GtkSearchBar* _searchBar;
-    GtkSearchEntry* _search;
-    GtkBox* _bars; ///< below the panes
+    FilterBar _filter; ///< of the topmost pane
+    std::optional<FilterBar> _pageFilter;
+    GtkButton* _lists; ///< shows a list as a table, or as rows
+    GtkBox* _bars;     ///< below the panes
     GtkBox* _toolbar;
     GtkSpinner* _spinner;
     GtkLabel* _status;

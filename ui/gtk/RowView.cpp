@@ -1,6 +1,7 @@
 #include "ui/gtk/RowView.h"
 
 #include "ui/gtk/ShownText.h"
+#include "ui/gtk/Style.h"
 #include "ui/gtk/Translation.h"
 
 #include <algorithm>
@@ -14,14 +15,6 @@ namespace {
 constexpr int kAccessoryMargin = 8;
 constexpr const char* kChangedClass = "pallax-changed";
 constexpr const char* kOpenClass = "pallax-open";
-
-void setClass(GtkWidget* widget, const char* name, bool isSet) {
-    if (isSet) {
-        gtk_widget_add_css_class(widget, name);
-    } else {
-        gtk_widget_remove_css_class(widget, name);
-    }
-}
 
 GtkLabel* dimLabel() {
     GtkWidget* label = gtk_label_new(nullptr);

@@ -2,8 +2,6 @@
 
 #include "ui/gtk/Ref.h"
 
-#include <gtk/gtk.h>
-
 namespace pallax::gtk {
 
 namespace {
@@ -13,14 +11,17 @@ constexpr const char* kStyle = R"(
 .pallax-rows { background: none; }
 .pallax-rows > row { padding: 0; margin: 0; border-radius: 0; }
 .pallax-rows label { padding: 0; }
-.pallax-rows undershoot.right {
+.pallax-rows undershoot.right, .pallax-table undershoot.right {
     background: linear-gradient(to left, alpha(@window_fg_color, 0.3), transparent 14px);
 }
+.pallax-table undershoot.left { background: none; }
 .pallax-rows undershoot.left {
     background: linear-gradient(to right, alpha(@window_fg_color, 0.3), transparent 14px);
 }
 .pallax-changed { color: @accent_color; }
 .pallax-open { background: alpha(@accent_bg_color, 0.2); }
+.pallax-headings { border-bottom: 1px solid @borders; }
+.pallax-heading { padding: 0; min-width: 0; min-height: 0; border-radius: 0; }
 .pallax-toolbar { border-top: 1px solid @borders; min-height: 34px; padding: 4px 10px; }
 .pallax-banner { padding: 4px 10px; background: alpha(@warning_bg_color, 0.3); }
 )";
@@ -37,6 +38,14 @@ void addStyle() {
         return true;
     }();
     (void)isAdded;
+}
+
+void setClass(GtkWidget* widget, const char* name, bool isSet) {
+    if (isSet) {
+        gtk_widget_add_css_class(widget, name);
+    } else {
+        gtk_widget_remove_css_class(widget, name);
+    }
 }
 
 } // namespace pallax::gtk

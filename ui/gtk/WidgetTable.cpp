@@ -21,11 +21,12 @@ WidgetTable& widgetTable(ui::TableView& table) {
 }
 
 WidgetTable::WidgetTable(ui::TableSource& source, const PangoMetrics& metrics, const Guard& guard,
-                         double inset)
+                         double inset, ListLook* look)
     : _source(source), _metrics(metrics), _guard(guard),
       _widget(owned(GTK_OVERLAY(gtk_overlay_new()))),
+      _content(GTK_BOX(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0))),
       _scroller(GTK_SCROLLED_WINDOW(gtk_scrolled_window_new())),
-      _rows(gtk_string_list_new(nullptr)), _inset(inset),
+      _rows(gtk_string_list_new(nullptr)), _look(look), _inset(inset),
       _width(kFirstWidth - kAccessoryWidth - inset) {
     makeList();
     listen();
@@ -63,7 +64,9 @@ void WidgetTable::makeList() {
     gtk_widget_set_can_target(GTK_WIDGET(_placeholder), FALSE);
     gtk_scrolled_window_set_policy(_scroller, GTK_POLICY_NEVER, GTK_POLICY_AUTOMATIC);
     gtk_scrolled_window_set_child(_scroller, GTK_WIDGET(_list));
-    gtk_overlay_set_child(_widget.get(), GTK_WIDGET(_scroller));
+    gtk_widget_set_vexpand(GTK_WIDGET(_scroller), TRUE);
+    gtk_box_append(_content, GTK_WIDGET(_scroller));
+    gtk_overlay_set_child(_widget.get(), GTK_WIDGET(_content));
     gtk_overlay_add_overlay(_widget.get(), GTK_WIDGET(_placeholder));
     gtk_widget_set_vexpand(widget(), TRUE);
     gtk_widget_set_hexpand(widget(), TRUE);
@@ -202,6 +205,7 @@ void WidgetTable::reloadData() {
         gtk_string_list_splice(_rows.get(), had, 0, texts.data());
     }
     showPlaceholder();
+    refreshTable();
     if (gtk_widget_get_mapped(GTK_WIDGET(_list)) == 0) {
         for (auto& [item, bound] : _bound) { // filled when it is seen
             bound.isStale = true;
@@ -237,8 +241,12 @@ void WidgetTable::activate(guint position) {
         return;
     }
     const std::size_t row = pane().rowAt(position);
-    _selecting();
     pane().moveCursorTo(position);
+    openRow(row);
+}
+
+void WidgetTable::openRow(std::size_t row) {
+    _selecting();
     const PaneRow selected = pane().row(row);
     const std::string path = childPath(pane().path(), selected.name);
     const auto leafSelected = _leafSelected;
@@ -293,6 +301,7 @@ void WidgetTable::widthChanged() {
         }
     }
     fillView(true);
+    focusWanted();
 }
 
 void WidgetTable::setOpenRow(std::optional<std::string> name) {
@@ -303,6 +312,9 @@ void WidgetTable::setOpenRow(std::optional<std::string> name) {
 }
 
 void WidgetTable::setFilter(std::string text) {
+    if (isShownAsTable() && _columns != nullptr) {
+        _columns->model().setFilter(text);
+    }
     pane().setFilter(std::move(text));
     reloadData();
 }

@@ -1,11 +1,13 @@
 #pragma once
 
 #include "app/pane/PaneModel.h"
+#include "app/table/PaneTable.h"
 #include "platform/ui/TableView.h"
 #include "ui/gtk/PangoMetrics.h"
 #include "ui/gtk/Ref.h"
 #include "ui/gtk/RowView.h"
 #include "ui/gtk/Signals.h"
+#include "ui/gtk/TableView.h"
 
 #include <cstddef>
 #include <functional>
@@ -23,9 +25,10 @@ namespace pallax::gtk {
 /// the others when they come into view. Its source owns a pane.
 class WidgetTable final : public ui::TableView {
 public:
-    /// `metrics` must outlive the table. The content area of its cells begins at `inset` points.
+    /// `metrics` and `look` must outlive the table. The content area of its cells begins at `inset`
+    /// points. Without a look, lists are rows.
     WidgetTable(ui::TableSource& source, const PangoMetrics& metrics, const Guard& guard,
-                double inset = 0);
+                double inset = 0, ListLook* look = nullptr);
     ~WidgetTable() override;
     WidgetTable(const WidgetTable&) = delete;
     WidgetTable& operator=(const WidgetTable&) = delete;
@@ -50,6 +53,14 @@ public:
     void setOpenRow(std::optional<std::string> name);
     void setFilter(std::string text);
     PaneModel& pane() const;
+    /// Whether the pane shows a list that can be a table with columns, and whether it is one.
+    bool isListWithColumns() const;
+    bool isShownAsTable() const { return isListWithColumns() && _look->asTables; }
+    /// Shows lists as tables, or as rows again. The cursor stays on its entry.
+    void switchLook();
+    /// Brings a row of the source into view, and the keyboard to it. Clears the filter if it hides
+    /// the row.
+    void select(std::size_t row);
 
 private:
     /// A row of the list that has widgets.
@@ -75,6 +86,9 @@ private:
     RowNotes notesOf(const PaneRow& row) const;
     Range rowsInView() const;
     void fillView(bool onlyStale);
+    void refreshTable();
+    void focusWanted();
+    void openRow(std::size_t row);
     void showPlaceholder();
     void remember(const Bound& bound, double offset);
     void widthChanged();
@@ -88,6 +102,7 @@ private:
     Guard _guard;
     mutable PaneModel* _pane = nullptr; ///< the source's, once it was asked for
     Ref<GtkOverlay> _widget;
+    GtkBox* _content;             ///< the rows, or the table with columns
     GtkScrolledWindow* _scroller; // the widget owns it and what follows
     GtkListView* _list = nullptr;
     GtkLabel* _placeholder = nullptr;
@@ -95,9 +110,13 @@ private:
     std::map<GtkListItem*, Bound> _bound;
     std::map<std::string, double> _offsets; ///< of rows that are scrolled sideways, by name
     std::optional<std::string> _openRow;
+    std::optional<std::string> _wanted; ///< the row that gets the keyboard as soon as it can
     std::function<void()> _selecting = [] {};
     std::function<void(const std::string&, const std::string&)> _leafSelected =
         [](const std::string& /*path*/, const std::string& /*text*/) {};
+    ListLook* _look;
+    PaneTable _listed;                        ///< fills the table with columns
+    std::unique_ptr<gtk::TableView> _columns; ///< once it was shown
     double _inset;
     double _width; ///< of a cell's content, in points
     std::vector<std::pair<gpointer, gulong>> _handlers;

@@ -82,7 +82,7 @@ std::unique_ptr<ui::ScreenView> WidgetToolkit::makeScreenView() {
 }
 
 std::unique_ptr<ui::TableView> WidgetToolkit::makeTableView(ui::TableSource& source) {
-    return std::make_unique<WidgetTable>(source, _frame.metrics(), _guard);
+    return std::make_unique<WidgetTable>(source, _frame.metrics(), _guard, 0, &_lists);
 }
 
 /// There is one layout for every name: a list, the field, and the two buttons.

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "app/table/PaneTable.h"
 #include "platform/ui/Toolkit.h"
 #include "ui/gtk/MainFrame.h"
 #include "ui/gtk/Signals.h"
@@ -23,9 +24,13 @@ public:
     ui::ModalOutlets loadLayout(std::string_view name, ui::TableSource& source) override;
     void showAlert(const ui::Alert& alert) override { _frame.showAlert(alert); }
 
+    /// For the tables of all panes.
+    ListLook& lists() { return _lists; }
+
 private:
     MainFrame& _frame;
     Guard _guard;
+    ListLook _lists;
 };
 
 } // namespace pallax::gtk

@@ -4,11 +4,6 @@
 
 namespace pallax::terminal {
 
-std::string eventTime(Time time, std::chrono::seconds ahead) {
-    constexpr std::size_t kTimeOfDay = 11; // in "2023-11-14 22:14:06"
-    return localDateText(time, ahead).substr(kTimeOfDay);
-}
-
 std::string eventWords(std::string words, const Marks& marks) {
     constexpr std::string_view kArrow = "→";
     const std::size_t arrow = marks.asciiOnly ? words.find(kArrow) : std::string::npos;

@@ -1,13 +1,11 @@
 #pragma once
 
-#include "timeline/Event.h"
-#include "timeline/Moment.h"
+#include "ui/contents/EventsContent.h"
 #include "ui/pages/PageTable.h"
 
-#include <chrono>
 #include <cstdint>
 #include <functional>
-#include <optional>
+#include <utility>
 
 namespace pallax::terminal {
 
@@ -15,35 +13,22 @@ namespace pallax::terminal {
 class EventsPage {
 public:
     struct Surroundings {
-        std::function<Moment()> moment;
+        EventsContent::Surroundings events;
         std::function<void(std::uint64_t packet)> goTo;
-        std::function<std::chrono::seconds()> ahead; ///< local time minus UTC
         PageTable::Copy copy;
     };
 
     explicit EventsPage(Surroundings surroundings)
-        : _surroundings(std::move(surroundings)), _table(_surroundings.copy) {}
+        : _goTo(std::move(surroundings.goTo)), _content(std::move(surroundings.events)),
+          _table(std::move(surroundings.copy)) {}
 
     PageAnswer handle(const KeyEvent& event);
     void draw(const PageScreen& screen, const PageSurroundings& around);
 
 private:
-    /// What the table was made of.
-    struct Shown {
-        const Timeline* timeline;
-        std::uint64_t instant;
-        std::uint64_t events; ///< including those that were dropped
-        std::chrono::seconds ahead;
-        bool operator==(const Shown&) const = default;
-    };
-
-    void fill(const Marks& marks);
-    /// The event of the cursor's row; null without one.
-    const Event* selected() const;
-
-    Surroundings _surroundings;
+    std::function<void(std::uint64_t packet)> _goTo;
+    EventsContent _content;
     PageTable _table;
-    std::optional<Shown> _shown;
 };
 
 } // namespace pallax::terminal

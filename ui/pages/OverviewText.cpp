@@ -1,6 +1,7 @@
 #include "ui/pages/OverviewText.h"
 
 #include "overview/StatusWords.h"
+#include "ui/contents/TimeOfDay.h"
 #include "ui/drawing/Plot.h"
 #include "ui/drawing/TextWidth.h"
 #include "ui/drawing/Tints.h"
@@ -269,7 +270,7 @@ Block Blocks::events() const {
     constexpr std::size_t kLeast = 3;
     Block block{"Events", {}, kLeast};
     for (auto event = _overview.events.rbegin(); event != _overview.events.rend(); ++event) {
-        block.rows.push_back({{eventTime(event->time, _overview.ahead) + "  ", kPale},
+        block.rows.push_back({{timeOfDay(event->time, _overview.ahead) + "  ", kPale},
                               {eventWords(event->words, _marks)}});
     }
     return block;

@@ -1,7 +1,6 @@
 #include "ui/pages/QueryPage.h"
 
 #include "ui/drawing/Prompt.h"
-#include "ui/pages/EventText.h"
 
 #include <utility>
 
@@ -19,19 +18,18 @@ constexpr std::string_view kNoRows = "The query gave no rows.";
 
 } // namespace
 
-QueryPage::QueryPage(Surroundings surroundings)
-    : _surroundings(std::move(surroundings)), _table(_surroundings.copy),
-      _earlier(_surroundings.seams.earlier()), _sentence(kExample) {
+QueryPage::QueryPage(QueryContent::Surroundings surroundings, PageTable::Copy copy)
+    : _content(std::move(surroundings)), _table(std::move(copy)) {
     startTyping();
 }
 
 void QueryPage::startTyping() {
     _line.emplace();
-    _recalled = _earlier.size();
+    _content.startTyping();
 }
 
 PageAnswer QueryPage::handle(const KeyEvent& event) {
-    _note.clear();
+    _note = {};
     if (_line) {
         return handleLine(event);
     }
@@ -51,7 +49,7 @@ PageAnswer QueryPage::handleLine(const KeyEvent& event) {
     const bool erasesNothing = event.key == Key::Backspace && _line->text().empty();
     if (event.key == Key::Escape || erasesNothing) {
         _line.reset();
-        return _hasAnswer ? PageAnswer::Handled : PageAnswer::Closes;
+        return _content.hasAnswer() ? PageAnswer::Handled : PageAnswer::Closes;
     }
     switch (event.key) {
     case Key::Enter:
@@ -71,75 +69,57 @@ PageAnswer QueryPage::handleLine(const KeyEvent& event) {
 }
 
 void QueryPage::recall(bool isEarlier) {
-    if (isEarlier ? _recalled == 0 : _recalled == _earlier.size()) {
-        return;
+    if (const auto query = _content.recall(isEarlier, _line->text())) {
+        _line->setText(*query);
     }
-    if (_recalled == _earlier.size()) {
-        _typed = _line->text();
-    }
-    _recalled = isEarlier ? _recalled - 1 : _recalled + 1;
-    _line->setText(_recalled == _earlier.size() ? _typed : _earlier[_recalled]);
 }
 
 /// After a failure the line stays, so that it can be corrected.
 void QueryPage::run(const std::string& query) {
-    if (_earlier.empty() || _earlier.back() != query) {
-        _earlier.push_back(query);
-        _surroundings.seams.remember(query);
-    }
-    _recalled = _earlier.size();
-    const Moment moment = _surroundings.moment();
-    QueryAnswer answer{{}, std::string(kNothingToAsk), true};
-    if (moment.timeline != nullptr) {
-        _isRunning = true;
-        answer = answerQuery(*moment.timeline, query, _surroundings.mayGoOn,
-                             _surroundings.seams.addFunctions);
-        _isRunning = false;
-        addTimeOfDay(answer.table, _surroundings.ahead());
-        for (TableRow& row : answer.table.rows) {
-            for (TableCell& cell : row.cells) { // the words of events have an arrow
-                cell.text = eventWords(std::move(cell.text), _surroundings.marks);
-            }
-        }
-    }
-    _sentence = std::move(answer.sentence);
-    _hasAnswer = !answer.hasFailed;
-    if (_hasAnswer && answer.table.rows.empty()) {
-        _sentence = kNoRows;
-    }
-    _table.model().show(_hasAnswer ? std::move(answer.table) : TableContent());
-    if (_hasAnswer) {
+    _content.run(query, _table.model());
+    if (_content.hasAnswer()) {
         _line.reset();
     }
 }
 
 PageAnswer QueryPage::goToRow() {
-    const auto row = _table.model().cursorRow();
-    const Moment moment = _surroundings.moment();
-    if (!row || moment.timeline == nullptr) {
-        return PageAnswer::Handled;
-    }
-    const auto packet = packetOf(_table.model().content(), *row, *moment.timeline);
-    if (!packet) {
+    const QueryContent::Went went = _content.goThere(_table.model());
+    if (went == QueryContent::Went::NoInstant) {
         _note = kNoInstant;
-        return PageAnswer::Handled;
     }
-    _surroundings.goTo(*packet);
-    return PageAnswer::Closes;
+    return went == QueryContent::Went::There ? PageAnswer::Closes : PageAnswer::Handled;
+}
+
+/// About the latest query.
+std::string_view QueryPage::words() const {
+    switch (_content.state()) {
+    case QueryState::NotAsked:
+        return kExample;
+    case QueryState::NothingToAsk:
+        return kNothingToAsk;
+    case QueryState::Running:
+        return kRunning;
+    case QueryState::NoRows:
+        return kNoRows;
+    case QueryState::Failed:
+    case QueryState::Answered:
+        break;
+    }
+    return _content.sentence();
 }
 
 void QueryPage::draw(const PageScreen& screen, const PageSurroundings& around) {
-    PageTable::Words words{.title = "Query", .empty = _sentence};
-    if (_isRunning) {
-        words.empty = kRunning;
+    const bool isRunning = _content.state() == QueryState::Running;
+    PageTable::Words words{.title = "Query", .empty = this->words()};
+    if (isRunning) {
         words.message = kRunning;
     } else if (_table.model().cursorRow()) {
-        words.message = _note.empty() ? _sentence : _note;
+        words.message = _note.empty() ? this->words() : _note;
         words.hints = {{"; query", typed(U';')}, {"Enter go there", {.key = Key::Enter}}};
     } else {
         words.hints = {{"; query", typed(U';')}};
     }
-    if (_line && !_isRunning) {
+    if (_line && !isRunning) {
         words.prompt = {";", &*_line, {"Esc close", {.key = Key::Escape}}};
     }
     _table.draw(screen, around, words);

@@ -1,5 +1,6 @@
 #include "ui/terminal/FrontEnd.h"
 
+#include "ui/pages/EventText.h"
 #include "ui/pages/Overlays.h"
 #include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/PaneView.h"
@@ -100,16 +101,24 @@ void FrontEnd::openOverview() {
     needsDisplay();
 }
 
+Wording FrontEnd::wording() const {
+    return [this](std::string words) { return eventWords(std::move(words), _marks); };
+}
+
+PageTable::Copy FrontEnd::copier() {
+    return [this](const std::string& text) { copy(text); };
+}
+
 void FrontEnd::openEvents() {
-    _pages.open(EventsPage({_surroundings.moment, _surroundings.goTo, _surroundings.ahead,
-                            [this](const std::string& text) { copy(text); }}));
+    _pages.open(EventsPage(
+        {{_surroundings.moment, _surroundings.ahead, wording()}, _surroundings.goTo, copier()}));
     needsDisplay();
 }
 
 void FrontEnd::openQuery() {
     _pages.open(QueryPage({_surroundings.moment, _surroundings.goTo, _surroundings.mayGoOn,
-                           _surroundings.queries, _surroundings.ahead, _marks,
-                           [this](const std::string& text) { copy(text); }}));
+                           _surroundings.queries, _surroundings.ahead, wording()},
+                          copier()));
     needsDisplay();
 }
 

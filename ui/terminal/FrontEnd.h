@@ -1,6 +1,7 @@
 #pragma once
 
 #include "timeline/Moment.h"
+#include "ui/contents/TextFinder.h"
 #include "ui/drawing/Grid.h"
 #include "ui/drawing/HitMap.h"
 #include "ui/drawing/Keys.h"
@@ -11,7 +12,6 @@
 #include "ui/pages/HelpPage.h"
 #include "ui/pages/Pages.h"
 #include "ui/pages/ShownValues.h"
-#include "ui/pages/TextFinder.h"
 #include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/TerminalToolkit.h"
 #include "ui/terminal/TimeControl.h"
@@ -150,6 +150,9 @@ private:
     void openGraph();
     void handleValueKey(char32_t character);
     TextFinder::Surroundings finderSurroundings();
+    /// In the characters of the terminal.
+    Wording wording() const;
+    PageTable::Copy copier();
     std::size_t conditions() const;
     void noteSearch(const std::string& text, SearchScope scope);
     void goToPlace(const std::vector<std::size_t>& place);

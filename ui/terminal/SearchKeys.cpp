@@ -1,3 +1,4 @@
+#include "app/WayToRow.h"
 #include "ui/terminal/FrontEnd.h"
 
 #include <algorithm>
@@ -41,18 +42,18 @@ TextFinder::Surroundings FrontEnd::finderSurroundings() {
 }
 
 void FrontEnd::openSearch() {
-    _pages.open(
-        SearchPage({_finder,
-                    [this](const std::string& text, const FoundRow& row) {
-                        noteSearch(text, SearchScope::Frame);
-                        goToPlace(row.place);
-                        _isPaneWanted = true;
-                    },
-                    [this](const std::string& text, std::uint64_t packet) {
-                        noteSearch(text, SearchScope::Recording);
-                        _surroundings.goTo(packet);
-                    },
-                    _surroundings.ahead, _marks, [this](const std::string& text) { copy(text); }}));
+    _pages.open(SearchPage({_finder,
+                            [this](const std::string& text, const FoundRow& row) {
+                                noteSearch(text, SearchScope::Frame);
+                                goToPlace(row.place);
+                                _isPaneWanted = true;
+                            },
+                            [this](const std::string& text, std::uint64_t packet) {
+                                noteSearch(text, SearchScope::Recording);
+                                _surroundings.goTo(packet);
+                            },
+                            _surroundings.ahead, wording()},
+                           copier()));
     needsDisplay();
 }
 
@@ -64,20 +65,8 @@ void FrontEnd::noteSearch(const std::string& text, SearchScope scope) {
     _search = Search{text, scope, conditions()};
 }
 
-/// Opens the panes on the way to a row, except those that are open, and moves the cursor there.
 void FrontEnd::goToPlace(const std::vector<std::size_t>& place) {
-    TerminalNavigation& panes = *navigation();
-    std::size_t depth = 0;
-    while (depth + 1 < panes.screens().size() && depth + 1 < place.size() &&
-           paneAt(panes, depth).nodeAt(place[depth]) == paneAt(panes, depth + 1).node()) {
-        ++depth;
-    }
-    panes.popTo(depth, false);
-    for (; depth + 1 < place.size(); ++depth) {
-        table()->select(place[depth]);
-        table()->source().didSelectRow(place[depth]);
-    }
-    table()->select(place.back());
+    openWay(*navigation(), place, [this](std::size_t row) { table()->select(row); });
     needsDisplay();
 }
 

@@ -39,52 +39,24 @@ void TerminalTable::reloadData() {
     }
     keepCursorInWindow();
     if (_look != nullptr && _look->asTables) {
-        refreshList(); // at each tick, so that it knows what has changed
+        // At each tick, so that it knows what has changed.
+        _listed.refresh(_list.model(), pane(), *_look);
     } else {
-        _listed = nullptr;
+        _listed.forget();
     }
     _needsDisplay();
 }
 
-void TerminalTable::refreshList() {
-    const NodeRef& node = pane().node();
-    if (node == _listed) {
-        return;
-    }
-    const bool isFollowed = _listed != nullptr;
-    TableModel& model = _list.model();
-    TableContent content;
-    if (isListWithColumns()) {
-        content = tableOf(*node, pane().path(), _look->partAt);
-        addAges(content, agesOf(*node, pane().path(), _look->ageAt));
-    }
-    model.update(std::move(content),
-                 isFollowed ? TableModel::Changes::Mark : TableModel::Changes::Ignore);
-    if (const auto row = pane().cursorRow(); row && !isFollowed) {
-        model.select(*row);
-    }
-    _listed = node;
-}
-
-void TerminalTable::refreshAges() {
-    TableModel& model = _list.model();
-    for (const std::size_t column : model.columns()) {
-        if (model.content().columns[column].isExtra) {
-            model.setCells(column, agesOf(*_listed, pane().path(), _look->ageAt));
-        }
-    }
-}
-
 bool TerminalTable::isListWithColumns() const {
-    return _look != nullptr && pane().node() != nullptr && isTable(*pane().node());
+    return _look != nullptr && showsTable(pane());
 }
 
 ColumnTable* TerminalTable::list() {
     if (_look == nullptr || !_look->asTables || !isListWithColumns()) {
         return nullptr;
     }
-    refreshList();
-    refreshAges();
+    _listed.refresh(_list.model(), pane(), *_look);
+    _listed.refreshAges(_list.model(), pane(), *_look);
     return &_list;
 }
 

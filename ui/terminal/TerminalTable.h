@@ -1,7 +1,7 @@
 #pragma once
 
 #include "app/pane/PaneModel.h"
-#include "app/table/ListTable.h"
+#include "app/table/PaneTable.h"
 #include "platform/ui/TableView.h"
 #include "ui/drawing/ColumnTable.h"
 
@@ -12,13 +12,6 @@
 #include <string_view>
 
 namespace pallax::terminal {
-
-/// How the panes of a toolkit show lists.
-struct ListLook {
-    bool asTables = false; ///< instead of rows that open
-    EntryPartAt partAt = [](const std::string& /*path*/) { return EntryPart::None; };
-    LeafAgeAt ageAt = [](const std::string& /*path*/) { return std::nullopt; };
-};
 
 /// A table of which a terminal shows a window of rows. Its source owns a pane, which knows the
 /// rows, the filter and the cursor; the window follows the cursor. A list can be shown as a table
@@ -90,10 +83,6 @@ private:
     /// The last row at which a window can begin without room below its rows.
     std::size_t lastFirstShown() const;
     void keepCursorInWindow();
-    /// Fills the table with columns again if the pane has new data.
-    void refreshList();
-    /// Ages grow while nothing arrives.
-    void refreshAges();
     void switchLook();
 
     ui::TableSource& _source;
@@ -101,7 +90,7 @@ private:
     ui::Rect _contentBounds;
     NeedsDisplay _needsDisplay;
     ListLook* _look;
-    NodeRef _listed; ///< the node in the table with columns; null if it is out of date
+    PaneTable _listed; ///< fills the table with columns
     ColumnTable _list;
     std::size_t _windowRows = 1;
     std::size_t _firstShown = 0;

@@ -58,8 +58,14 @@ private:
 
     void add(GtkWidget* widget) {
         const std::string name = G_OBJECT_TYPE_NAME(widget);
+        if (gtk_widget_has_css_class(widget, "pallax-headings") != FALSE) {
+            _headings = stripCells(widget);
+            return line("columns: " + joined(_headings));
+        }
         if (name == "GtkListItemWidget") {
-            return addRow(widget);
+            const bool isCells = gtk_widget_get_ancestor(widget, GTK_TYPE_LIST_VIEW) != nullptr &&
+                                 findBelow<GtkWidget>(widget, GTK_TYPE_FIXED) == nullptr;
+            return isCells ? addCells(widget) : addRow(widget);
         }
         if (name == "GtkWindowControls") {
             return; // the shell's
@@ -104,6 +110,74 @@ private:
         for (GtkWidget* child : childrenOf(widget)) {
             add(child);
         }
+    }
+
+    /// A heading or a value of a table, which is at least partly seen.
+    struct Cell {
+        std::string text;
+        long left; ///< in the window
+        long width;
+    };
+
+    /// The cells of a row, or the headings: of the part that stays, and of the one that is pushed.
+    std::vector<Cell> stripCells(GtkWidget* strip) {
+        std::vector<Cell> cells;
+        for (GtkWidget* part : childrenOf(strip)) {
+            const graphene_rect_t room = boundsIn(part, _window);
+            for (GtkWidget* child : childrenOf(part)) {
+                const graphene_rect_t bounds = boundsIn(child, _window);
+                const float end = bounds.origin.x + bounds.size.width;
+                if (end > room.origin.x + 1 &&
+                    bounds.origin.x < room.origin.x + room.size.width - 1) {
+                    cells.push_back({textOfCell(child), std::lround(bounds.origin.x),
+                                     std::lround(bounds.size.width)});
+                }
+            }
+        }
+        return cells;
+    }
+
+    static std::string textOfCell(GtkWidget* cell) {
+        const bool isHeading = GTK_IS_BUTTON(cell) != FALSE;
+        auto* label = findBelow<GtkLabel>(cell, GTK_TYPE_LABEL);
+        std::string text =
+            isHeading ? gtk_widget_get_tooltip_text(cell) : gtk_label_get_text(label);
+        text += isHeading && gtk_label_get_xalign(label) > 0.5F ? " (right)" : "";
+        text += gtk_widget_has_css_class(cell, "pallax-changed") != FALSE ? " (changed)" : "";
+        return text;
+    }
+
+    static std::string joined(const std::vector<Cell>& cells) {
+        std::string text;
+        for (const Cell& cell : cells) {
+            text += (text.empty() ? "" : " | ") + cell.text;
+        }
+        return text;
+    }
+
+    void addCells(GtkWidget* row) {
+        GtkWidget* list = gtk_widget_get_ancestor(row, GTK_TYPE_SCROLLED_WINDOW);
+        const graphene_rect_t bounds = boundsIn(row, list);
+        if (bounds.origin.y + bounds.size.height <= 0 ||
+            bounds.origin.y >= static_cast<float>(gtk_widget_get_height(list))) {
+            return;
+        }
+        GtkWidget* strip = gtk_widget_get_first_child(row);
+        const std::vector<Cell> cells = stripCells(strip);
+        std::string text = "cells";
+        text += gtk_widget_has_css_class(strip, "pallax-open") != FALSE ? " (cursor)" : "";
+        text += gtk_widget_has_focus(row) != FALSE ? " (focus)" : "";
+        text += gtk_widget_has_css_class(strip, "dim-label") != FALSE ? " (dim)" : "";
+        bool isBelowHeadings = cells.size() == _headings.size();
+        for (std::size_t index = 0; isBelowHeadings && index < cells.size(); ++index) {
+            // A margin of the label is not in its place.
+            const Cell& heading = _headings[index];
+            isBelowHeadings =
+                cells[index].left >= heading.left &&
+                cells[index].left + cells[index].width <= heading.left + heading.width &&
+                cells[index].left < heading.left + 12;
+        }
+        line(text + ": " + joined(cells) + (isBelowHeadings ? "" : " (not below the headings)"));
     }
 
     void addRow(GtkWidget* row) {
@@ -175,6 +249,7 @@ private:
 
     GtkWidget* _window;
     std::string _text;
+    std::vector<Cell> _headings; ///< of the table above the rows
 };
 
 } // namespace

@@ -50,6 +50,7 @@ button: Save
 
 const char* const kSideBySide = R"(
 button: Back
+button: Show as Table
 title: Measured Neighbor Cells / 
 row: 0 (at 10) [go-next-symbolic]
 row: 1 (at 10) [go-next-symbolic]
@@ -132,6 +133,7 @@ TEST_F(WindowScreens, AVanishedPathPopsBackToThePaneBelow) {
         Dictionary{{"Measured Neighbor Cells", Array{Dictionary{{"Physical Cell ID", "275"}}}}});
     EXPECT_EQ(stage.dump(), R"(
 button: Back
+button: Show as Table
 title: Measured Neighbor Cells / 
 row: 0 (at 10) [go-next-symbolic]
 text: Updated 2023-11-14 at 22:13:20

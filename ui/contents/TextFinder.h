@@ -11,7 +11,7 @@
 #include <utility>
 #include <vector>
 
-namespace pallax::terminal {
+namespace pallax {
 
 /// Finds a text in the shown frame, or in the whole recording, whose values are read once.
 class TextFinder {
@@ -49,4 +49,4 @@ private:
     std::optional<Appearances> _appearances{std::in_place};
 };
 
-} // namespace pallax::terminal
+} // namespace pallax

@@ -1,10 +1,10 @@
-#include "ui/pages/QueryAnswer.h"
+#include "ui/contents/QueryAnswer.h"
 
 #include "query/Database.h"
 #include "query/QueryErrorText.h"
 #include "query/TimelineTables.h"
 #include "timeline/Timeline.h"
-#include "ui/pages/EventText.h"
+#include "ui/contents/TimeOfDay.h"
 
 #include <algorithm>
 #include <charconv>
@@ -12,7 +12,7 @@
 #include <system_error>
 #include <utility>
 
-namespace pallax::terminal {
+namespace pallax {
 
 namespace {
 
@@ -134,7 +134,7 @@ void addTimeOfDay(TableContent& table, std::chrono::seconds ahead) {
     for (std::size_t row = 0; row < times.size(); ++row) {
         auto& cells = table.rows[row].cells;
         cells.insert(cells.begin() + place,
-                     {times[row] ? eventTime(*times[row], ahead) : std::string()});
+                     {times[row] ? timeOfDay(*times[row], ahead) : std::string()});
     }
 }
 
@@ -155,4 +155,4 @@ std::optional<std::uint64_t> packetOf(const TableContent& table, std::size_t row
     return timeline.instantAt(*time + kRest);
 }
 
-} // namespace pallax::terminal
+} // namespace pallax

@@ -1,10 +1,10 @@
-#include "ui/pages/TextFinder.h"
+#include "ui/contents/TextFinder.h"
 
 #include "app/pane/FindIgnoringCase.h"
 
 #include <string_view>
 
-namespace pallax::terminal {
+namespace pallax {
 
 std::vector<FoundRow> TextFinder::rows(const std::string& text) const {
     const NodeRef shown = root();
@@ -26,4 +26,4 @@ TextFinder::Instants TextFinder::instants(const std::string& text) {
     return found;
 }
 
-} // namespace pallax::terminal
+} // namespace pallax

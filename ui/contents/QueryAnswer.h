@@ -10,11 +10,9 @@
 #include <string>
 
 namespace pallax {
+
 class Database;
 class Timeline;
-} // namespace pallax
-
-namespace pallax::terminal {
 
 /// The answer to a query, as a table.
 struct QueryAnswer {
@@ -42,4 +40,4 @@ void addTimeOfDay(TableContent& table, std::chrono::seconds ahead);
 std::optional<std::uint64_t> packetOf(const TableContent& table, std::size_t row,
                                       const Timeline& timeline);
 
-} // namespace pallax::terminal
+} // namespace pallax

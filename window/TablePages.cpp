@@ -1,0 +1,165 @@
+#include "window/TablePages.h"
+
+#include "app/WayToRow.h"
+#include "ui/gtk/Translation.h"
+#include "ui/gtk/WidgetTable.h"
+
+#include <utility>
+
+namespace pallax {
+
+TablePages::TablePages(Surroundings surroundings)
+    : _frame(surroundings.frame), _guard(surroundings.guard), _viewer(surroundings.viewer),
+      _work(surroundings.work), _goTo(std::move(surroundings.goTo)),
+      _partAt([this](const std::string& path) { return _viewer.entryPart(path); }),
+      _finder(finderSurroundings()) {}
+
+std::vector<gtk::MenuEntry> TablePages::menu() {
+    return {{"events", gtk::translated("Events"), [this] { openEvents(); }},
+            {"find", gtk::translated("Find a Text"), [this] { openSearch(); }},
+            {"query", gtk::translated("Ask in SQL"), [this] { openQuery(); }}};
+}
+
+bool TablePages::handleKey(guint key) {
+    switch (key) {
+    case GDK_KEY_e:
+        toggle(_events ? _events->widget() : nullptr, &TablePages::openEvents);
+        return true;
+    case GDK_KEY_f:
+        toggle(_search ? _search->widget() : nullptr, &TablePages::openSearch);
+        return true;
+    case GDK_KEY_semicolon:
+        openQuery();
+        return true;
+    case GDK_KEY_t:
+        if (!_frame.isPageOpen()) {
+            _frame.switchLists();
+        }
+        return !_frame.isPageOpen();
+    default:
+        return false;
+    }
+}
+
+void TablePages::toggle(GtkWidget* page, void (TablePages::*open)()) {
+    if (page != nullptr && _frame.isPageOpen(page)) {
+        _frame.closePage();
+    } else {
+        (this->*open)();
+    }
+}
+
+void TablePages::refresh() {
+    if (_events && _frame.isPageOpen(_events->widget())) {
+        _events->refresh();
+    } else if (_search && _frame.isPageOpen(_search->widget())) {
+        _search->refresh();
+    }
+}
+
+void TablePages::forget() {
+    _frame.closePage();
+    _events.reset();
+    _search.reset();
+    _query.reset();
+}
+
+void TablePages::workLater(std::function<void()> work) {
+    _guard.queue().async([alive = std::weak_ptr<TablePages*>(_alive), work = std::move(work)] {
+        if (const auto pages = alive.lock()) {
+            (*pages)->_work.during(work);
+        }
+    });
+}
+
+EventsContent::Surroundings TablePages::eventsSurroundings() const {
+    return {.moment = [this] { return _viewer.travel().moment(); },
+            .ahead = [this] { return _viewer.zone(_viewer.now()).offset; }};
+}
+
+void TablePages::openEvents() {
+    if (!_events) {
+        _events.emplace(_frame.metrics(), _guard,
+                        gtk::EventsView::Surroundings{.events = eventsSurroundings(),
+                                                      .goTo = [this](std::uint64_t packet) {
+                                                          _frame.closePage();
+                                                          _goTo(packet);
+                                                      }});
+    }
+    _events->refresh();
+    _frame.openPage(_events->widget(), gtk::translated("Events"),
+                    [this](const std::string& text) { _events->table().setFilter(text); });
+    _events->table().focusCursor();
+}
+
+TextFinder::Surroundings TablePages::finderSurroundings() {
+    return {
+        .root = [this]() -> NodeRef {
+            const gtk::WidgetNavigation* panes = _frame.shownStack();
+            return panes != nullptr
+                       ? gtk::widgetTable(panes->screens().front()->table()).pane().node()
+                       : nullptr;
+        },
+        .partAt = _partAt,
+        .moment = [this] { return _viewer.travel().moment(); },
+        .mayGoOn =
+            [this] { return _work.mayGoOn(gtk::translated("The recording is being searched.")); }};
+}
+
+SearchContent::Surroundings TablePages::searchSurroundings() {
+    return {
+        .finder = _finder,
+        .goToRow = [this](const std::string& /*text*/, const FoundRow& row) { goToRow(row); },
+        .goToPacket = [this](const std::string& /*text*/, std::uint64_t packet) { _goTo(packet); },
+        .ahead = [this] { return _viewer.zone(_viewer.now()).offset; }};
+}
+
+void TablePages::openSearch() {
+    if (!_search) {
+        _search.emplace(_frame.metrics(), _guard,
+                        gtk::SearchView::Surroundings{
+                            .search = searchSurroundings(),
+                            .work = [this](auto search) { workLater(std::move(search)); },
+                            .close = [this] { _frame.closePage(); }});
+    }
+    _search->refresh();
+    _frame.openPage(_search->widget(), gtk::translated("Find a Text"));
+    _search->focus();
+}
+
+/// The page closes first: a row that is not seen cannot get the keyboard.
+void TablePages::goToRow(const FoundRow& row) {
+    gtk::WidgetNavigation* const panes = _frame.shownStack();
+    if (panes == nullptr) {
+        return;
+    }
+    _frame.closePage();
+    openWay(*panes, row.place,
+            [panes](std::size_t each) { gtk::widgetTable(panes->top().table()).select(each); });
+}
+
+QueryContent::Surroundings TablePages::querySurroundings() {
+    return {.moment = [this] { return _viewer.travel().moment(); },
+            .goTo = [this](std::uint64_t packet) { _goTo(packet); },
+            .mayGoOn = [this] { return _work.mayGoOn(gtk::translated("The query is running.")); },
+            .seams = _viewer.querySeams(),
+            .ahead = [this] { return _viewer.zone(_viewer.now()).offset; }};
+}
+
+void TablePages::openQuery() {
+    if (!_query) {
+        _query.emplace(_frame.metrics(), _guard,
+                       gtk::QueryView::Surroundings{
+                           .queries = querySurroundings(),
+                           .work = [this](auto query) { workLater(std::move(query)); },
+                           .close = [this] { _frame.closePage(); },
+                           .say = [this](const std::string& text) { _frame.setMessage(text); }});
+    }
+    if (!_frame.isPageOpen(_query->widget())) {
+        _frame.openPage(_query->widget(), gtk::translated("Ask in SQL"),
+                        [this](const std::string& text) { _query->table().setFilter(text); });
+    }
+    _query->focus();
+}
+
+} // namespace pallax
