@@ -1,10 +1,11 @@
 #include "window/WindowSession.h"
 
 #include "timeline/Timeline.h"
+#include "ui/contents/TravelWords.h"
 #include "ui/gtk/Translation.h"
-#include "window/ShownValue.h"
 
 #include <chrono>
+#include <map>
 #include <utility>
 
 namespace pallax {
@@ -15,27 +16,30 @@ using Wish = gtk::TimeBar::Wish;
 using Direction = Travel::Direction;
 
 constexpr std::chrono::milliseconds kPlayedFrame{200};
+constexpr std::chrono::minutes kLongStep{1};
 
 } // namespace
 
 WindowSession::WindowSession(Setup setup)
     : _queue(setup.queue), _frame(setup.frame), _notify(std::move(setup.notify)),
       _staysSafe(setup.request.options.safe), _isSafe(_staysSafe),
-      _toolkit(setup.frame, setup.guard), _viewer({.queue = setup.queue,
-                                                   .notices = setup.notices,
-                                                   .settings = setup.request.settings,
-                                                   .profile = setup.request.profile,
-                                                   .onFatalRecord = setup.request.onFatalRecord,
-                                                   .isSafe = _isSafe,
-                                                   .directory = std::move(setup.directory),
-                                                   .child = setup.child,
-                                                   .source = setup.request.options.source,
-                                                   .face = face()}),
+      _toolkit(setup.frame, setup.guard), _work(setup.queue, setup.frame),
+      _viewer({.queue = setup.queue,
+               .notices = setup.notices,
+               .settings = setup.request.settings,
+               .profile = setup.request.profile,
+               .onFatalRecord = setup.request.onFatalRecord,
+               .isSafe = _isSafe,
+               .directory = std::move(setup.directory),
+               .child = setup.child,
+               .source = setup.request.options.source,
+               .face = face()}),
       _instant(_viewer.travel(), _toolkit), _timeBar(setup.guard, timeActions()),
-      _profile(setup.request.profile), _values(valueSource()) {
+      _profile(setup.request.profile), _pages(setup.frame, setup.guard, valueSource()),
+      _changes(setup.frame, _viewer.travel()) {
     gtk_widget_set_visible(_timeBar.widget(), FALSE);
     _viewer.attach(_toolkit);
-    _frame.onLeaf([this](const auto& path, const auto& text) { openValue(path, text); });
+    _frame.onLeaf([this](const auto& path, const auto& text) { _pages.openValue(path, text); });
     _frame.setDetail(_overview.widget(), gtk::translated("Overview"));
     if (setup.request.settings.firstScreen == FirstScreen::Overview) {
         _frame.toggleDetail();
@@ -65,9 +69,10 @@ ViewerSession::Face WindowSession::face() {
             .timelineReplaced =
                 [this] {
                     forgetInstant();
-                    _values.forget();
+                    _pages.forget();
+                    _changes.forget();
                 },
-            .mayGoOn = [](const auto& /*words*/) { return true; }};
+            .mayGoOn = [this](const auto& words) { return _work.mayGoOn(words); }};
 }
 
 /// Comes also while there are no packets, when ages grow.
@@ -76,45 +81,47 @@ void WindowSession::tick() {
         _overview.show(_viewer.overview());
     }
     showTimeBar();
-    showValue();
+    _pages.update();
+    _changes.update();
 }
 
-terminal::ShownValues::Source WindowSession::valueSource() {
+ShownValues::Source WindowSession::valueSource() {
     return {.moment = [this] { return _viewer.travel().moment(); },
             .values = [this] { return _viewer.values(); },
             .names = [this]() -> const NetworkNames& { return _viewer.names(); },
             .time =
                 [this] {
                     const Time time = _viewer.time();
-                    return terminal::DisplayTime{time, _viewer.zone(time).offset};
+                    return DisplayTime{time, _viewer.zone(time).offset};
                 },
             .profile = [this]() -> const QualityProfile& { return _profile; }};
-}
-
-void WindowSession::openValue(const std::string& path, const std::string& text) {
-    _valuePath = path;
-    _valueText = text;
-    _frame.openPage(_value.widget(), path.substr(path.rfind('/') + 1));
-    showValue();
-}
-
-void WindowSession::showValue() {
-    if (_frame.isPageOpen()) {
-        _value.show(shownValue(_values, _valuePath, _valueText));
-    }
 }
 
 gtk::TimeBar::Actions WindowSession::timeActions() {
     return {.wish = [this](Wish what) { wish(what); },
             .toShare =
                 [this](double share) { travel([share](Travel& to) { return to.toShare(share); }); },
-            .goTo =
-                [this](const std::string& place) {
-                    travel([&place](Travel& to) { return to.goTo(place); });
-                }};
+            .goTo = [this](const std::string& place) { goTo(place); }};
+}
+
+/// Outside the toolkit's frames, because a search may take long.
+void WindowSession::goTo(const std::string& place) {
+    _work.begin([this, place] { travel([&place](Travel& to) { return to.goTo(place); }); });
+}
+
+void WindowSession::findAgain(Direction direction) {
+    _work.begin(
+        [this, direction] { travel([direction](Travel& to) { return to.findAgain(direction); }); });
 }
 
 void WindowSession::wish(Wish wish) {
+    if (wish == Wish::ShowChanges) {
+        return _changes.toggle();
+    }
+    if (wish == Wish::Mark) {
+        _changes.mark();
+        return showTimeBar();
+    }
     travel([wish](Travel& to) {
         switch (wish) {
         case Wish::HoldOrPlay:
@@ -129,6 +136,9 @@ void WindowSession::wish(Wish wish) {
             return to.stepEvent(Direction::Forward);
         case Wish::ToPresent:
             return to.toEnd();
+        case Wish::Mark:
+        case Wish::ShowChanges:
+            break; // above
         }
         return Travel::Refusal();
     });
@@ -162,6 +172,8 @@ void WindowSession::showInstant() {
     }
     _overview.show(_viewer.overview());
     showTimeBar();
+    _pages.update();
+    _changes.update();
 }
 
 /// The live panes come back before those of the instant go.
@@ -181,6 +193,9 @@ void WindowSession::showTimeBar() {
                               .clock = travel.clock(moment.instant),
                               .share = travel.shareOf(moment.instant),
                               .isPlaying = travel.isPlaying()};
+    if (const auto marked = travel.marked()) {
+        state.marked = travel.shareOf(*marked);
+    }
     if (moment.timeline != nullptr) {
         for (const Event& event : moment.timeline->events()) {
             state.events.push_back(travel.shareOf(event.packet));
@@ -217,28 +232,47 @@ void WindowSession::toggleSafe() {
 
 /// The same keys as on a terminal.
 bool WindowSession::handleKey(guint key) {
-    switch (key) {
-    case GDK_KEY_space:
-        wish(Wish::HoldOrPlay);
+    static const std::map<guint, void (*)(WindowSession&)> kKeys{
+        {GDK_KEY_space, [](auto& self) { self.wish(Wish::HoldOrPlay); }},
+        {GDK_KEY_comma, [](auto& self) { self.wish(Wish::TickBack); }},
+        {GDK_KEY_period, [](auto& self) { self.wish(Wish::TickForward); }},
+        {GDK_KEY_bracketleft, [](auto& self) { self.wish(Wish::EventBack); }},
+        {GDK_KEY_bracketright, [](auto& self) { self.wish(Wish::EventForward); }},
+        {GDK_KEY_braceleft,
+         [](auto& self) { self.travel([](Travel& to) { return to.stepTime(-kLongStep); }); }},
+        {GDK_KEY_braceright,
+         [](auto& self) { self.travel([](Travel& to) { return to.stepTime(kLongStep); }); }},
+        {GDK_KEY_asciicircum,
+         [](auto& self) { self.travel([](Travel& to) { return to.toStart(); }); }},
+        {GDK_KEY_dollar, [](auto& self) { self.wish(Wish::ToPresent); }},
+        {GDK_KEY_colon, [](auto& self) { self.typePlace(); }},
+        {GDK_KEY_n, [](auto& self) { self.findAgain(Direction::Forward); }},
+        {GDK_KEY_N, [](auto& self) { self.findAgain(Direction::Back); }},
+        {GDK_KEY_m, [](auto& self) { self.wish(Wish::Mark); }},
+        {GDK_KEY_d, [](auto& self) { self.wish(Wish::ShowChanges); }},
+        {GDK_KEY_parenleft, [](auto& self) { self.changeSpeed(&Travel::slower); }},
+        {GDK_KEY_parenright, [](auto& self) { self.changeSpeed(&Travel::faster); }},
+    };
+    if (_pages.handleKey(key)) {
         return true;
-    case GDK_KEY_comma:
-        wish(Wish::TickBack);
-        return true;
-    case GDK_KEY_period:
-        wish(Wish::TickForward);
-        return true;
-    case GDK_KEY_bracketleft:
-        wish(Wish::EventBack);
-        return true;
-    case GDK_KEY_bracketright:
-        wish(Wish::EventForward);
-        return true;
-    case GDK_KEY_dollar:
-        wish(Wish::ToPresent);
-        return true;
-    default:
-        return false;
     }
+    const auto found = kKeys.find(key);
+    if (found != kKeys.end()) {
+        found->second(*this);
+    }
+    return found != kKeys.end();
+}
+
+void WindowSession::typePlace() {
+    gtk_widget_set_visible(_timeBar.widget(), TRUE);
+    showTimeBar();
+    _timeBar.focusPlace();
+}
+
+void WindowSession::changeSpeed(void (Travel::*change)()) {
+    (_viewer.travel().*change)();
+    _frame.setMessage(speedWords(_viewer.travel()));
+    showTimeBar();
 }
 
 } // namespace pallax

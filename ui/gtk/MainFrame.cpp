@@ -108,6 +108,7 @@ void MainFrame::listen() {
     onSignal(_back, "clicked", _guard, [this] { back(); });
     onSignal(_save, "clicked", _guard, [this] { _saveAction(); });
     connect(_window.get(), "close-request", _guard, std::function<gboolean()>([this]() -> gboolean {
+                _work.stop();
                 _guard.queue().async(_actions.closed);
                 return TRUE; // the window goes with the program
             }));
@@ -289,6 +290,14 @@ void MainFrame::closePage() {
     }
 }
 
+void MainFrame::showWork(const std::string& words, std::function<void()> stop) {
+    _work.show(_pages, _guard, words, std::move(stop));
+}
+
+void MainFrame::endWork() {
+    _work.hide();
+}
+
 void MainFrame::present() {
     gtk_window_present(window());
 }
@@ -382,6 +391,9 @@ void MainFrame::back() {
 /// Comes before the widget with the focus, because rows of a list take the space bar. A widget that
 /// needs a key itself gets it: letters go to a field, the space bar presses a button.
 gboolean MainFrame::handleKey(guint key, guint /*code*/, GdkModifierType state) {
+    if (_work.isShown()) {
+        return _work.handleKey(key) ? TRUE : FALSE;
+    }
     const bool isAlt = (state & GDK_ALT_MASK) != 0;
     const bool isControl = (state & GDK_CONTROL_MASK) != 0;
     GtkWidget* focus = gtk_window_get_focus(window());

@@ -6,6 +6,7 @@
 #include "ui/gtk/Ref.h"
 #include "ui/gtk/Signals.h"
 #include "ui/gtk/WidgetNavigation.h"
+#include "ui/gtk/WorkCover.h"
 
 #include <adwaita.h>
 #include <functional>
@@ -80,6 +81,10 @@ public:
     void openPage(GtkWidget* widget, const std::string& title);
     bool isPageOpen() const { return _page != nullptr; }
     void closePage();
+    /// Long work, in place of everything: what is going on, and a button that stops it. No other
+    /// key or button does anything meanwhile. Words again replace the latest.
+    void showWork(const std::string& words, std::function<void()> stop);
+    void endWork();
 
 private:
     void build();
@@ -118,6 +123,7 @@ private:
     GtkButton* _save;
     GtkWidget* _modal = nullptr;
     GtkWidget* _page = nullptr;
+    WorkCover _work;
     std::function<void(const std::string&, const std::string&)> _leaf =
         [](const std::string& /*path*/, const std::string& /*text*/) {};
     Ref<GtkWidget> _detail; ///< beside the root pane

@@ -1,16 +1,16 @@
 #pragma once
 
 #include "timeline/Moment.h"
+#include "ui/contents/Graph.h"
+#include "ui/contents/ShownValues.h"
 #include "ui/drawing/Grid.h"
 #include "ui/drawing/HitMap.h"
 #include "ui/drawing/Keys.h"
 #include "ui/drawing/LineEditor.h"
 #include "ui/drawing/Marks.h"
 #include "ui/drawing/Origin.h"
-#include "ui/pages/Graph.h"
 #include "ui/pages/HelpPage.h"
 #include "ui/pages/Pages.h"
-#include "ui/pages/ShownValues.h"
 #include "ui/pages/TextFinder.h"
 #include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/TerminalToolkit.h"
