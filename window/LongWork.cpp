@@ -2,6 +2,7 @@
 
 #include "host/Interruption.h"
 
+#include <thread>
 #include <utility>
 
 namespace pallax {
@@ -10,6 +11,8 @@ namespace {
 
 constexpr std::chrono::milliseconds kSilentWork{100}; // before the page appears
 constexpr std::chrono::milliseconds kServing{30};
+constexpr std::chrono::microseconds kQuiet{2000};
+constexpr int kLooks = 10; // while it is quiet
 
 } // namespace
 
@@ -50,10 +53,17 @@ bool LongWork::mayGoOn(const std::string& words) {
     return !_isStopped && Interruption::signal() == 0;
 }
 
-/// Until it has nothing to do, but not for ever if something is always moving.
+/// Until it has had nothing to do for a while: a screen reader asks its next question when it has
+/// the answer to the one before. But not for ever, if something is always moving.
 void LongWork::serveToolkit() {
-    const auto latest = Clock::now() + kServing;
-    while (Clock::now() < latest && g_main_context_iteration(nullptr, FALSE) != FALSE) {
+    const auto begin = Clock::now();
+    auto now = begin;
+    for (auto latest = begin; now - latest < kQuiet && now - begin < kServing; now = Clock::now()) {
+        if (g_main_context_iteration(nullptr, FALSE) != FALSE) {
+            latest = now;
+        } else {
+            std::this_thread::sleep_for(kQuiet / kLooks);
+        }
     }
 }
 

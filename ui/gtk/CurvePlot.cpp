@@ -235,8 +235,15 @@ CurvePlot::CurvePlot(const Guard& guard, Pointed pointed)
 
 void CurvePlot::listen(const Guard& guard) {
     GtkEventController* motion = gtk_event_controller_motion_new();
-    connect(motion, "motion", guard,
-            std::function<void(double, double)>([this](double x, double) { point(x, true); }));
+    const auto entered = [this](double x, double y) { _pointer = {x, y}; };
+    const auto moved = [this](double x, double y) {
+        // The toolkit tells it again when something is drawn below a pointer that rests.
+        if (std::exchange(_pointer, std::pair(x, y)) != std::pair(x, y)) {
+            point(x, true);
+        }
+    };
+    connect(motion, "enter", guard, std::function<void(double, double)>(entered));
+    connect(motion, "motion", guard, std::function<void(double, double)>(moved));
     onSignal(motion, "leave", guard, [this] {
         if (std::exchange(_isHovering, false)) {
             _pointed(std::nullopt);

@@ -9,6 +9,7 @@
 #include <gtk/gtk.h>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace pallax::gtk {
@@ -59,7 +60,8 @@ private:
     Content _content;
     std::string _description;
     int _leastLabelWidth = 0;
-    bool _isHovering = false; ///< the cursor goes with the pointer
+    bool _isHovering = false;           ///< the cursor goes with the pointer
+    std::pair<double, double> _pointer; ///< where it was last
     Ref<GtkDrawingArea> _area;
 };
 

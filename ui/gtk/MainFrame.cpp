@@ -316,7 +316,15 @@ void MainFrame::showAlert(const ui::Alert& alert) {
 }
 
 void MainFrame::setMessage(const std::string& text) {
-    adw_toast_overlay_add_toast(_toasts, adw_toast_new(shownMarkup(text).c_str()));
+    if (_message) {
+        adw_toast_dismiss(_message.get()); // it would be shown for its time before the next one
+    }
+    _message = shared(adw_toast_new(""));
+    GtkWidget* label = gtk_label_new(shownText(text).c_str());
+    gtk_label_set_wrap(GTK_LABEL(label), TRUE); // a title would be cut on a phone
+    gtk_widget_add_css_class(label, "heading");
+    adw_toast_set_custom_title(_message.get(), label);
+    adw_toast_overlay_add_toast(_toasts, _message.get());
 }
 
 void MainFrame::setNote(std::string text) {

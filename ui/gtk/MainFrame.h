@@ -44,7 +44,7 @@ public:
     /// Shows one after the other.
     void showAlert(const ui::Alert& alert);
 
-    /// Shows an event that has just happened, for some seconds.
+    /// Shows an event that has just happened, for some seconds or until the next one.
     void setMessage(const std::string& text);
     void setNote(std::string text);
     void setStream(std::string state);
@@ -107,6 +107,7 @@ private:
     std::function<bool(guint, GdkModifierType)> _key = [](guint, GdkModifierType) { return false; };
     // The window owns what follows.
     AdwToastOverlay* _toasts;
+    Ref<AdwToast> _message; ///< the latest
     GtkStack* _pages;
     AdwHeaderBar* _header;
     AdwWindowTitle* _title;

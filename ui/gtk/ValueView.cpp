@@ -46,10 +46,10 @@ void ValueView::buildCurve(const Guard& guard, GtkBox* to) {
     onSignal(_graph, "clicked", guard, _actions.toggleInGraph);
     GtkWidget* open = gtk_button_new_with_label(translated("Open the Graph"));
     onSignal(open, "clicked", guard, _actions.openGraph);
-    GtkWidget* buttons = gtk_box_new(GTK_ORIENTATION_HORIZONTAL, kPageBorder);
-    gtk_box_append(GTK_BOX(buttons), GTK_WIDGET(_graph));
-    gtk_box_append(GTK_BOX(buttons), open);
-    gtk_box_append(to, buttons);
+    for (GtkWidget* button : {GTK_WIDGET(_graph), open}) { // side by side, they are too wide
+        gtk_widget_set_halign(button, GTK_ALIGN_START);
+        gtk_box_append(to, button);
+    }
 }
 
 void ValueView::show(Content content) {

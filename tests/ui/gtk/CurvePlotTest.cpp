@@ -39,6 +39,18 @@ TEST_F(CurvePlotTest, ThePointerReadsItUntilItLeaves) {
     EXPECT_EQ(tested.pointed[2], std::nullopt);
 }
 
+TEST_F(CurvePlotTest, APointerThatRestsDoesNotReadIt) {
+    CurvePlotStage tested;
+    tested.open();
+    GtkWidget* plot = tested.plot.widget();
+    point(plot, GTK_TYPE_EVENT_CONTROLLER_MOTION, "enter", 200);
+    point(plot, GTK_TYPE_EVENT_CONTROLLER_MOTION, "motion", 200);
+    EXPECT_TRUE(tested.pointed.empty()) << "a page was opened below it";
+    point(plot, GTK_TYPE_EVENT_CONTROLLER_MOTION, "motion", 201);
+    point(plot, GTK_TYPE_EVENT_CONTROLLER_MOTION, "motion", 201);
+    EXPECT_EQ(tested.pointed.size(), 1U);
+}
+
 TEST_F(CurvePlotTest, ATouchedPlaceStays) {
     CurvePlotStage tested;
     tested.open();
