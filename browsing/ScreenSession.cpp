@@ -78,7 +78,7 @@ terminal::FrontEnd::Surroundings ScreenSession::frontEndSurroundings() {
             .time =
                 [this, ahead] {
                     const Time time = _viewer.time();
-                    return terminal::DisplayTime{time, ahead(time)};
+                    return DisplayTime{time, ahead(time)};
                 },
             .goTo =
                 [this](std::uint64_t packet) {

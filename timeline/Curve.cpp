@@ -96,4 +96,11 @@ Curve readCurve(Timeline& timeline, FieldIndex field, EntryId entry, const Curve
     return curve;
 }
 
+const CurvePoint* pointAt(const Curve& curve, Time time) {
+    const auto after =
+        std::upper_bound(curve.points.begin(), curve.points.end(), time,
+                         [](Time wanted, const CurvePoint& point) { return wanted < point.time; });
+    return after == curve.points.begin() ? nullptr : &*(after - 1);
+}
+
 } // namespace pallax

@@ -5,6 +5,7 @@
 #include <chrono>
 #include <cstddef>
 #include <optional>
+#include <string>
 #include <vector>
 
 namespace pallax {
@@ -24,6 +25,15 @@ struct Curve {
     /// Points that are farther apart have nothing between them.
     std::chrono::nanoseconds gap{0};
     bool isReduced = false; ///< a point may stand for several numbers
+};
+
+/// The point at a time: the latest that is not later; null if there is none.
+const CurvePoint* pointAt(const Curve& curve, Time time);
+
+/// Something that happened in the time of a curve.
+struct CurveEvent {
+    Time time;
+    std::string words;
 };
 
 /// The packets of a time that ends at an instant.

@@ -64,14 +64,6 @@ void TablePages::forget() {
     _query.reset();
 }
 
-void TablePages::workLater(std::function<void()> work) {
-    _guard.queue().async([alive = std::weak_ptr<TablePages*>(_alive), work = std::move(work)] {
-        if (const auto pages = alive.lock()) {
-            (*pages)->_work.during(work);
-        }
-    });
-}
-
 EventsContent::Surroundings TablePages::eventsSurroundings() const {
     return {.moment = [this] { return _viewer.travel().moment(); },
             .ahead = [this] { return _viewer.zone(_viewer.now()).offset; }};
@@ -119,7 +111,7 @@ void TablePages::openSearch() {
         _search.emplace(_frame.metrics(), _guard,
                         gtk::SearchView::Surroundings{
                             .search = searchSurroundings(),
-                            .work = [this](auto search) { workLater(std::move(search)); },
+                            .work = [this](auto search) { _work.begin(std::move(search)); },
                             .close = [this] { _frame.closePage(); }});
     }
     _search->refresh();
@@ -151,7 +143,7 @@ void TablePages::openQuery() {
         _query.emplace(_frame.metrics(), _guard,
                        gtk::QueryView::Surroundings{
                            .queries = querySurroundings(),
-                           .work = [this](auto query) { workLater(std::move(query)); },
+                           .work = [this](auto query) { _work.begin(std::move(query)); },
                            .close = [this] { _frame.closePage(); },
                            .say = [this](const std::string& text) { _frame.setMessage(text); }});
     }

@@ -7,7 +7,7 @@
 #include "ui/gtk/Menu.h"
 #include "ui/gtk/QueryView.h"
 #include "ui/gtk/SearchView.h"
-#include "ui/gtk/WorkNotice.h"
+#include "window/LongWork.h"
 
 #include <cstdint>
 #include <functional>
@@ -25,7 +25,7 @@ public:
         gtk::MainFrame& frame;
         const gtk::Guard& guard;
         ViewerSession& viewer;
-        gtk::WorkNotice& work;
+        LongWork& work;
         std::function<void(std::uint64_t packet)> goTo; ///< shows an instant
     };
 
@@ -54,20 +54,17 @@ private:
     void openQuery();
     void toggle(GtkWidget* page, void (TablePages::*open)());
     void goToRow(const FoundRow& row);
-    /// Runs work that may take long, outside the signals.
-    void workLater(std::function<void()> work);
 
     gtk::MainFrame& _frame;
     gtk::Guard _guard;
     ViewerSession& _viewer;
-    gtk::WorkNotice& _work;
+    LongWork& _work;
     std::function<void(std::uint64_t packet)> _goTo;
     EntryPartAt _partAt;
     TextFinder _finder;
     std::optional<gtk::EventsView> _events;
     std::optional<gtk::SearchView> _search;
     std::optional<gtk::QueryView> _query;
-    std::shared_ptr<TablePages*> _alive = std::make_shared<TablePages*>(this);
 };
 
 } // namespace pallax

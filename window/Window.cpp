@@ -75,7 +75,10 @@ private:
         std::vector<std::vector<gtk::MenuEntry>> sections{
             {{"overview", gtk::translated("Overview"), [this] { _frame.toggleDetail(); }},
              {"search", gtk::translated("Search Rows"), [this] { _frame.toggleSearch(); }},
-             {"time", gtk::translated("Time Bar"), onSession(&WindowSession::toggleTimeBar)}},
+             {"time", gtk::translated("Time Bar"), onSession(&WindowSession::toggleTimeBar)},
+             {"graph", gtk::translated("Graph"), onSession(&WindowSession::openGraph)},
+             {"changes", gtk::translated("Changes since the Mark"),
+              onSession(&WindowSession::toggleChanges)}},
             _session->tablePages().menu(),
             {{"safe", gtk::translated("Hide Identities"), onSession(&WindowSession::toggleSafe),
               [this] { return _session && _session->isSafe(); }},

@@ -1,10 +1,11 @@
 #include "window/WindowSession.h"
 
 #include "timeline/Timeline.h"
+#include "ui/contents/TravelWords.h"
 #include "ui/gtk/Translation.h"
-#include "window/ShownValue.h"
 
 #include <chrono>
+#include <map>
 #include <utility>
 
 namespace pallax {
@@ -15,25 +16,27 @@ using Wish = gtk::TimeBar::Wish;
 using Direction = Travel::Direction;
 
 constexpr std::chrono::milliseconds kPlayedFrame{200};
+constexpr std::chrono::minutes kLongStep{1};
 
 } // namespace
 
 WindowSession::WindowSession(Setup setup)
     : _queue(setup.queue), _frame(setup.frame), _notify(std::move(setup.notify)),
       _staysSafe(setup.request.options.safe), _isSafe(_staysSafe),
-      _toolkit(setup.frame, setup.guard), _viewer({.queue = setup.queue,
-                                                   .notices = setup.notices,
-                                                   .settings = setup.request.settings,
-                                                   .profile = setup.request.profile,
-                                                   .onFatalRecord = setup.request.onFatalRecord,
-                                                   .isSafe = _isSafe,
-                                                   .directory = std::move(setup.directory),
-                                                   .child = setup.child,
-                                                   .source = setup.request.options.source,
-                                                   .face = face()}),
+      _toolkit(setup.frame, setup.guard), _work(setup.queue, setup.frame),
+      _viewer({.queue = setup.queue,
+               .notices = setup.notices,
+               .settings = setup.request.settings,
+               .profile = setup.request.profile,
+               .onFatalRecord = setup.request.onFatalRecord,
+               .isSafe = _isSafe,
+               .directory = std::move(setup.directory),
+               .child = setup.child,
+               .source = setup.request.options.source,
+               .face = face()}),
       _instant(_viewer.travel(), _toolkit), _timeBar(setup.guard, timeActions()),
-      _profile(setup.request.profile), _values(valueSource()),
-      _work(setup.frame.window(), setup.guard),
+      _profile(setup.request.profile), _pages(setup.frame, setup.guard, valueSource()),
+      _changes(setup.frame, _viewer.travel()),
       _tables({.frame = setup.frame,
                .guard = setup.guard,
                .viewer = _viewer,
@@ -44,13 +47,9 @@ WindowSession::WindowSession(Setup setup)
     gtk_widget_set_visible(_timeBar.widget(), FALSE);
     _toolkit.lists() = {.asTables = setup.request.settings.lists == Lists::Table,
                         .partAt = [this](const auto& path) { return _viewer.entryPart(path); },
-                        .ageAt =
-                            [this](const auto& path) {
-                                _values.update();
-                                return _values.ageAt(path);
-                            }};
+                        .ageAt = [this](const auto& path) { return _pages.ageAt(path); }};
     _viewer.attach(_toolkit);
-    _frame.onLeaf([this](const auto& path, const auto& text) { openValue(path, text); });
+    _frame.onLeaf([this](const auto& path, const auto& text) { _pages.openValue(path, text); });
     _frame.setDetail(_overview.widget(), gtk::translated("Overview"));
     if (setup.request.settings.firstScreen == FirstScreen::Overview) {
         _frame.toggleDetail();
@@ -80,7 +79,8 @@ ViewerSession::Face WindowSession::face() {
             .timelineReplaced =
                 [this] {
                     forgetInstant();
-                    _values.forget();
+                    _pages.forget();
+                    _changes.forget();
                     _tables.forgetTimeline();
                 },
             .mayGoOn = [this](const auto& words) { return _work.mayGoOn(words); }};
@@ -92,46 +92,48 @@ void WindowSession::tick() {
         _overview.show(_viewer.overview());
     }
     showTimeBar();
-    showValue();
+    _pages.update();
+    _changes.update();
     _tables.refresh();
 }
 
-terminal::ShownValues::Source WindowSession::valueSource() {
+ShownValues::Source WindowSession::valueSource() {
     return {.moment = [this] { return _viewer.travel().moment(); },
             .values = [this] { return _viewer.values(); },
             .names = [this]() -> const NetworkNames& { return _viewer.names(); },
             .time =
                 [this] {
                     const Time time = _viewer.time();
-                    return terminal::DisplayTime{time, _viewer.zone(time).offset};
+                    return DisplayTime{time, _viewer.zone(time).offset};
                 },
             .profile = [this]() -> const QualityProfile& { return _profile; }};
-}
-
-void WindowSession::openValue(const std::string& path, const std::string& text) {
-    _valuePath = path;
-    _valueText = text;
-    _frame.openPage(_value.widget(), path.substr(path.rfind('/') + 1));
-    showValue();
-}
-
-void WindowSession::showValue() {
-    if (_frame.isPageOpen(_value.widget())) {
-        _value.show(shownValue(_values, _valuePath, _valueText));
-    }
 }
 
 gtk::TimeBar::Actions WindowSession::timeActions() {
     return {.wish = [this](Wish what) { wish(what); },
             .toShare =
                 [this](double share) { travel([share](Travel& to) { return to.toShare(share); }); },
-            .goTo =
-                [this](const std::string& place) {
-                    travel([&place](Travel& to) { return to.goTo(place); });
-                }};
+            .goTo = [this](const std::string& place) { goTo(place); }};
+}
+
+/// Outside the toolkit's frames, because a search may take long.
+void WindowSession::goTo(const std::string& place) {
+    _work.begin([this, place] { travel([&place](Travel& to) { return to.goTo(place); }); });
+}
+
+void WindowSession::findAgain(Direction direction) {
+    _work.begin(
+        [this, direction] { travel([direction](Travel& to) { return to.findAgain(direction); }); });
 }
 
 void WindowSession::wish(Wish wish) {
+    if (wish == Wish::ShowChanges) {
+        return _changes.toggle();
+    }
+    if (wish == Wish::Mark) {
+        _changes.mark();
+        return showTimeBar();
+    }
     travel([wish](Travel& to) {
         switch (wish) {
         case Wish::HoldOrPlay:
@@ -146,17 +148,18 @@ void WindowSession::wish(Wish wish) {
             return to.stepEvent(Direction::Forward);
         case Wish::ToPresent:
             return to.toEnd();
+        case Wish::Mark:
+        case Wish::ShowChanges:
+            break; // above
         }
         return Travel::Refusal();
     });
 }
 
 void WindowSession::travel(const std::function<Travel::Refusal(Travel&)>& action) {
-    _work.during([&] {
-        if (const Travel::Refusal refusal = action(_viewer.travel())) {
-            _frame.setMessage(*refusal);
-        }
-    });
+    if (const Travel::Refusal refusal = action(_viewer.travel())) {
+        _frame.setMessage(*refusal);
+    }
     gtk_widget_set_visible(_timeBar.widget(), TRUE);
     showInstant();
     _viewer.tellTrouble();
@@ -181,6 +184,8 @@ void WindowSession::showInstant() {
     }
     _overview.show(_viewer.overview());
     showTimeBar();
+    _pages.update();
+    _changes.update();
     _tables.refresh();
 }
 
@@ -201,6 +206,9 @@ void WindowSession::showTimeBar() {
                               .clock = travel.clock(moment.instant),
                               .share = travel.shareOf(moment.instant),
                               .isPlaying = travel.isPlaying()};
+    if (const auto marked = travel.marked()) {
+        state.marked = travel.shareOf(*marked);
+    }
     if (moment.timeline != nullptr) {
         for (const Event& event : moment.timeline->events()) {
             state.events.push_back(travel.shareOf(event.packet));
@@ -238,28 +246,47 @@ void WindowSession::toggleSafe() {
 
 /// The same keys as on a terminal.
 bool WindowSession::handleKey(guint key) {
-    switch (key) {
-    case GDK_KEY_space:
-        wish(Wish::HoldOrPlay);
+    static const std::map<guint, void (*)(WindowSession&)> kKeys{
+        {GDK_KEY_space, [](auto& self) { self.wish(Wish::HoldOrPlay); }},
+        {GDK_KEY_comma, [](auto& self) { self.wish(Wish::TickBack); }},
+        {GDK_KEY_period, [](auto& self) { self.wish(Wish::TickForward); }},
+        {GDK_KEY_bracketleft, [](auto& self) { self.wish(Wish::EventBack); }},
+        {GDK_KEY_bracketright, [](auto& self) { self.wish(Wish::EventForward); }},
+        {GDK_KEY_braceleft,
+         [](auto& self) { self.travel([](Travel& to) { return to.stepTime(-kLongStep); }); }},
+        {GDK_KEY_braceright,
+         [](auto& self) { self.travel([](Travel& to) { return to.stepTime(kLongStep); }); }},
+        {GDK_KEY_asciicircum,
+         [](auto& self) { self.travel([](Travel& to) { return to.toStart(); }); }},
+        {GDK_KEY_dollar, [](auto& self) { self.wish(Wish::ToPresent); }},
+        {GDK_KEY_colon, [](auto& self) { self.typePlace(); }},
+        {GDK_KEY_n, [](auto& self) { self.findAgain(Direction::Forward); }},
+        {GDK_KEY_N, [](auto& self) { self.findAgain(Direction::Back); }},
+        {GDK_KEY_m, [](auto& self) { self.wish(Wish::Mark); }},
+        {GDK_KEY_d, [](auto& self) { self.wish(Wish::ShowChanges); }},
+        {GDK_KEY_parenleft, [](auto& self) { self.changeSpeed(&Travel::slower); }},
+        {GDK_KEY_parenright, [](auto& self) { self.changeSpeed(&Travel::faster); }},
+    };
+    if (_pages.handleKey(key)) {
         return true;
-    case GDK_KEY_comma:
-        wish(Wish::TickBack);
-        return true;
-    case GDK_KEY_period:
-        wish(Wish::TickForward);
-        return true;
-    case GDK_KEY_bracketleft:
-        wish(Wish::EventBack);
-        return true;
-    case GDK_KEY_bracketright:
-        wish(Wish::EventForward);
-        return true;
-    case GDK_KEY_dollar:
-        wish(Wish::ToPresent);
-        return true;
-    default:
-        return _tables.handleKey(key);
     }
+    const auto found = kKeys.find(key);
+    if (found != kKeys.end()) {
+        found->second(*this);
+    }
+    return found != kKeys.end() || _tables.handleKey(key);
+}
+
+void WindowSession::typePlace() {
+    gtk_widget_set_visible(_timeBar.widget(), TRUE);
+    showTimeBar();
+    _timeBar.focusPlace();
+}
+
+void WindowSession::changeSpeed(void (Travel::*change)()) {
+    (_viewer.travel().*change)();
+    _frame.setMessage(speedWords(_viewer.travel()));
+    showTimeBar();
 }
 
 } // namespace pallax

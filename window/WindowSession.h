@@ -6,10 +6,11 @@
 #include "ui/gtk/MainFrame.h"
 #include "ui/gtk/OverviewView.h"
 #include "ui/gtk/TimeBar.h"
-#include "ui/gtk/ValueView.h"
 #include "ui/gtk/WidgetToolkit.h"
-#include "ui/pages/ShownValues.h"
+#include "window/ChangesPage.h"
+#include "window/LongWork.h"
 #include "window/TablePages.h"
+#include "window/ValuePages.h"
 
 #include <functional>
 #include <memory>
@@ -46,6 +47,8 @@ public:
     TablePages& tablePages() { return _tables; }
     /// Shows the time bar, or no longer, and then the present.
     void toggleTimeBar();
+    void openGraph() { _pages.openGraph(); }
+    void toggleChanges() { _changes.toggle(); }
     void startAfresh() { _viewer.startAfresh(); }
     bool isSafe() const { return _isSafe; }
     void toggleSafe();
@@ -54,12 +57,14 @@ public:
 
 private:
     ViewerSession::Face face();
-    terminal::ShownValues::Source valueSource();
+    ShownValues::Source valueSource();
     gtk::TimeBar::Actions timeActions();
-    void openValue(const std::string& path, const std::string& text);
-    void showValue();
     void travel(const std::function<Travel::Refusal(Travel&)>& action);
     void wish(gtk::TimeBar::Wish wish);
+    void goTo(const std::string& place);
+    void findAgain(Travel::Direction direction);
+    void typePlace();
+    void changeSpeed(void (Travel::*change)());
     void showInstant();
     void showTimeBar();
     void forgetInstant();
@@ -71,17 +76,15 @@ private:
     bool _staysSafe; ///< it was started so
     bool _isSafe;
     gtk::WidgetToolkit _toolkit;
+    LongWork _work;
     ViewerSession _viewer;
     InstantPanes _instant;
     gtk::OverviewView _overview;
     gtk::TimeBar _timeBar;
     const QualityProfile& _profile;
-    terminal::ShownValues _values;
-    gtk::ValueView _value;
-    std::string _valuePath;                   ///< of the value that its page shows
-    std::string _valueText;                   ///< of its row, when the page was opened
+    ValuePages _pages;
+    ChangesPage _changes;
     std::unique_ptr<RepeatingTimer> _playing; ///< while time plays
-    gtk::WorkNotice _work;
     TablePages _tables;
 };
 

@@ -123,6 +123,56 @@ TEST_F(EndToEndWindow, AListIsATableWithColumns) {
               "press 'Show as Rows' lacks 'Physical Cell ID 184, *'"));
 }
 
+TEST_F(EndToEndWindow, ACurveIsReadByKeysAndForAnotherTime) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' open 'Serving Cell Measurements' "
+                       "open 'Measured RSRP: *' has 'Curve: -100.25*22:10:19*last -94.5 dBm' "
+                       "press 'the last 30 seconds' has 'Curve: *22:14:49 *' "
+                       "key End has '22:15:19  -94.5 dBm*' key Left has '22:15:1*' "
+                       "key + key - has 'Curve: *22:14:19 *'"));
+}
+
+TEST_F(EndToEndWindow, TheGraphHasTheCurvesOfSeveralValues) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' open 'Serving Cell Measurements' "
+                       "open 'Measured RSRP: *' press 'Add to the Graph' "
+                       "has 'In the graph (1 of 6)*' press Back "
+                       "open 'Measured RSRQ: *' has 'Curve: -14.5*' key v "
+                       "has 'In the graph (2 of 6)*' key V "
+                       "has 'Curves: a  -94.50 dBm  Measured RSRP, Serving*' "
+                       "has 'Curves: b  -11.00 dB  Measured RSRQ, Serving*' "
+                       "key V lacks 'Curves: a*'"));
+}
+
+TEST_F(EndToEndWindow, WhatDiffersFromTheMarkIsAPage) {
+    expectDriven(
+        drive(sample("lte-drive.pcap") + " --speed max",
+              "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key d "
+              "has 'Mark an instant first, with the key m.' "
+              "key [ has '22:15:19, held*' key m has 'Marked 22:15:19*' "
+              "key [ has '22:15:18, held*' key d has 'Changes from 22:15:19 to 22:15:18' "
+              "key [ has 'Changes from 22:15:19 to 22:15:*' key Escape lacks 'Changes from *'"));
+}
+
+TEST_F(EndToEndWindow, ALongSearchTellsHowFarItIsAndIsCancelled) {
+    std::vector<Packet> packets;
+    for (int number = 0; number < 100000; ++number) {
+        packets.emplace_back(milliseconds(number), registration(number % 2 == 0 ? 0 : 1));
+    }
+    const std::string recording = record("long.pcap", packets);
+    // For each packet, a long text is made.
+    const std::string never = "length(replace(hex(zeroblob(4000)), 0, 12)) < 0";
+    expectDriven(drive(recording + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:00' focus 'SIM Info' key ^ "
+                       "has '22:13:20, held*' key : "
+                       "type 'Go to a time, or to where a condition becomes true=" +
+                           never +
+                           "' key Return has 'Searching: *' press Cancel "
+                           "has 'The search was stopped.' lacks 'Searching: *' "
+                           "key Return has 'Searching: *' key Escape lacks 'Searching: *' "
+                           "press 'To the present' lacks '22:13:20, held*'"));
+}
+
 TEST_F(EndToEndWindow, SpeaksGermanButKeepsTheModemsTexts) {
     if (!std::filesystem::exists(PALLAX_BINARY_DIR "/locale")) {
         GTEST_SKIP() << "gettext is not installed";

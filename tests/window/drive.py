@@ -6,12 +6,13 @@
   press NAME       presses the button with this name
   open NAME        goes to the row with this name by keys, and presses Enter
   focus NAME       goes to it
-  key KEY          presses a key: Escape, Right, e
+  key KEY          presses a key: Escape, Right, m
   type NAME=TEXT   puts the text into the field with this name
   tree             prints all names
 
-A NAME that ends in * is the beginning of one. Prints what failed and ends with status 1.
+A * in a NAME stands for any text. Prints what failed and ends with status 1.
 """
+import fnmatch
 import sys
 import time
 
@@ -21,7 +22,7 @@ gi.require_version("Atspi", "2.0")
 from gi.repository import Atspi  # noqa: E402
 
 PATIENCE = 20  # seconds
-KEYS = {"space": 0x20, "Tab": 0xFF09, "Up": 0xFF52, "Return": 0xFF0D, "Escape": 0xFF1B, "Right": 0xFF53, "Left": 0xFF51, "Down": 0xFF54}
+KEYS = {"space": 0x20, "Tab": 0xFF09, "Up": 0xFF52, "Return": 0xFF0D, "Escape": 0xFF1B, "Right": 0xFF53, "Left": 0xFF51, "Down": 0xFF54, "Home": 0xFF50, "End": 0xFF57}
 
 
 def children(node):
@@ -45,6 +46,15 @@ def walk(node):
         yield from walk(child)
 
 
+def walk_back(node):
+    """The same nodes from the last one."""
+    if node is None:
+        return
+    for child in reversed(children(node)):
+        yield from walk_back(child)
+    yield node
+
+
 def is_shown(node):
     states = node.get_state_set()
     return states.contains(Atspi.StateType.VISIBLE)
@@ -52,17 +62,16 @@ def is_shown(node):
 
 def find(name, role=None):
     """The last one: pages that are covered by others come before them."""
-    found = None
-    for window in windows():
-        for node in walk(window):
+    for window in reversed(list(windows())):
+        for node in walk_back(window):
             try:
                 own = node.get_name() or ""
-                matches = own.startswith(name[:-1]) if name.endswith("*") else own == name
+                matches = fnmatch.fnmatchcase(own, name.replace("[", "[[]"))
                 if matches and (role is None or node.get_role() == role) and is_shown(node):
-                    found = node
+                    return node
             except Exception:  # it is gone
                 continue
-    return found
+    return None
 
 
 def await_result(look, what):
@@ -84,8 +93,8 @@ def tree():
 
 
 def press_key(name):
-    symbol = ord(name) if len(name) == 1 else KEYS[name]
-    Atspi.generate_keyboard_event(symbol, None, Atspi.KeySynthType.SYM)
+    code = KEYS[name] if name in KEYS else ord(name)
+    Atspi.generate_keyboard_event(code, None, Atspi.KeySynthType.SYM)
 
 
 def has_focus(node):
@@ -131,7 +140,10 @@ def step(verb, argument):
     elif verb == "lacks":
         await_result(lambda: find(argument) is None, "still there: " + argument)
     elif verb == "press":
-        button = await_result(lambda: find(argument, Atspi.Role.PUSH_BUTTON), "no button " + argument)
+        button = await_result(
+            lambda: find(argument, Atspi.Role.PUSH_BUTTON) or find(argument, Atspi.Role.TOGGLE_BUTTON),
+            "no button " + argument,
+        )
         button.get_action_iface().do_action(0)
     elif verb == "open":
         row = await_result(lambda: find(argument), "no row " + argument)

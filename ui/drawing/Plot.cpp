@@ -132,7 +132,7 @@ private:
 
     /// The line of the cursor and the marks of events above the time axis, below the curves.
     void drawLines() {
-        for (const PlotEvent& event : _plot.events) {
+        for (const CurveEvent& event : _plot.events) {
             _grid.put(columnAt(event.time), _area.y + _rows - 1, _marks.event, kPaleAxis);
         }
         for (int y = _area.y; _plot.cursor && y < _area.y + _rows; ++y) {
@@ -213,7 +213,7 @@ private:
         _grid.put(_left - kMarkColumns - columnsOf(_plot.unit), y, _plot.unit, kPaleAxis, room);
         _grid.put(_left - 1, y, _marks.bottomLeft, kPaleAxis);
         _grid.fill({_left, end}, y, _marks.horizontal, kPaleAxis);
-        for (const PlotEvent& event : _plot.events) {
+        for (const CurveEvent& event : _plot.events) {
             _grid.put(columnAt(event.time), y, _marks.event);
         }
         for (const TimeLabel& label : timeLabels(_plot.from, _plot.to, _plot.ahead, _columns)) {
@@ -266,13 +266,6 @@ void drawPlot(Grid& grid, const Marks& marks, const Plot& plot, PlotArea area, i
     if (area.rows >= kLeastPlotRows && curveColumns(plot, area.columns, labels) > 0) {
         PlotDrawing(grid, marks, plot, area, labels).draw();
     }
-}
-
-const CurvePoint* pointAt(const Curve& curve, Time time) {
-    const auto after =
-        std::upper_bound(curve.points.begin(), curve.points.end(), time,
-                         [](Time wanted, const CurvePoint& point) { return wanted < point.time; });
-    return after == curve.points.begin() ? nullptr : &*(after - 1);
 }
 
 std::string sparkline(const Marks& marks, const Curve& curve, Time from, Time to, int columns) {

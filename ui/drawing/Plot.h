@@ -1,7 +1,7 @@
 #pragma once
 
 #include "timeline/Curve.h"
-#include "ui/drawing/Axes.h"
+#include "ui/contents/Axes.h"
 #include "ui/drawing/Grid.h"
 #include "ui/drawing/Marks.h"
 
@@ -19,12 +19,6 @@ struct PlotCurve {
     Tint tint = Tint::None;
 };
 
-/// Something that happened, as a mark above the time axis.
-struct PlotEvent {
-    Time time;
-    std::string words;
-};
-
 /// Curves of values in one unit over a time.
 struct Plot {
     Time from;
@@ -32,7 +26,7 @@ struct Plot {
     std::chrono::seconds ahead{0}; ///< local time minus UTC
     std::string unit;
     std::vector<PlotCurve> curves;
-    std::vector<PlotEvent> events;
+    std::vector<CurveEvent> events; ///< marks above the time axis
     std::optional<Time> cursor;
 
     bool isEmpty() const;
@@ -53,9 +47,6 @@ int curveColumns(const Plot& plot, int columns, int labels);
 
 /// Draws the curves with both axes; the time axis is in the last row.
 void drawPlot(Grid& grid, const Marks& marks, const Plot& plot, PlotArea area, int labels);
-
-/// The point at a time: the latest that is not later.
-const CurvePoint* pointAt(const Curve& curve, Time time);
 
 /// A curve in one row, from its least to its greatest value.
 std::string sparkline(const Marks& marks, const Curve& curve, Time from, Time to, int columns);

@@ -115,6 +115,7 @@ void MainFrame::listen() {
     onSignal(_save, "clicked", _guard, [this] { _saveAction(); });
     onSignal(_lists, "clicked", _guard, [this] { switchLists(); });
     connect(_window.get(), "close-request", _guard, std::function<gboolean()>([this]() -> gboolean {
+                _work.stop();
                 _guard.queue().async(_actions.closed);
                 return TRUE; // the window goes with the program
             }));
@@ -302,6 +303,14 @@ void MainFrame::closePage() {
     }
 }
 
+void MainFrame::showWork(const std::string& words, std::function<void()> stop) {
+    _work.show(_pages, _guard, words, std::move(stop));
+}
+
+void MainFrame::endWork() {
+    _work.hide();
+}
+
 void MainFrame::present() {
     gtk_window_present(window());
 }
@@ -320,7 +329,15 @@ void MainFrame::showAlert(const ui::Alert& alert) {
 }
 
 void MainFrame::setMessage(const std::string& text) {
-    adw_toast_overlay_add_toast(_toasts, adw_toast_new(shownMarkup(text).c_str()));
+    if (_message) {
+        adw_toast_dismiss(_message.get()); // it would be shown for its time before the next one
+    }
+    _message = shared(adw_toast_new(""));
+    GtkWidget* label = gtk_label_new(shownText(text).c_str());
+    gtk_label_set_wrap(GTK_LABEL(label), TRUE); // a title would be cut on a phone
+    gtk_widget_add_css_class(label, "heading");
+    adw_toast_set_custom_title(_message.get(), label);
+    adw_toast_overlay_add_toast(_toasts, _message.get());
 }
 
 void MainFrame::setNote(std::string text) {
@@ -395,6 +412,9 @@ void MainFrame::back() {
 /// Comes before the widget with the focus, because rows of a list take the space bar. A widget that
 /// needs a key itself gets it: letters go to a field, the space bar presses a button.
 gboolean MainFrame::handleKey(guint key, guint /*code*/, GdkModifierType state) {
+    if (_work.isShown()) {
+        return _work.handleKey(key) ? TRUE : FALSE;
+    }
     const bool isAlt = (state & GDK_ALT_MASK) != 0;
     const bool isControl = (state & GDK_CONTROL_MASK) != 0;
     GtkWidget* focus = gtk_window_get_focus(window());

@@ -7,6 +7,7 @@
 #include "ui/gtk/Ref.h"
 #include "ui/gtk/Signals.h"
 #include "ui/gtk/WidgetNavigation.h"
+#include "ui/gtk/WorkCover.h"
 
 #include <adwaita.h>
 #include <functional>
@@ -45,7 +46,7 @@ public:
     /// Shows one after the other.
     void showAlert(const ui::Alert& alert);
 
-    /// Shows an event that has just happened, for some seconds.
+    /// Shows an event that has just happened, for some seconds or until the next one.
     void setMessage(const std::string& text);
     void setNote(std::string text);
     void setStream(std::string state);
@@ -92,6 +93,10 @@ public:
         return _page != nullptr && gtk_widget_get_parent(widget) == _page;
     }
     void closePage();
+    /// Long work, in place of everything: what is going on, and a button that stops it. No other
+    /// key or button does anything meanwhile. Words again replace the latest.
+    void showWork(const std::string& words, std::function<void()> stop);
+    void endWork();
 
 private:
     void build();
@@ -113,6 +118,7 @@ private:
     std::function<bool(guint, GdkModifierType)> _key = [](guint, GdkModifierType) { return false; };
     // The window owns what follows.
     AdwToastOverlay* _toasts;
+    Ref<AdwToast> _message; ///< the latest
     GtkStack* _pages;
     AdwHeaderBar* _header;
     AdwWindowTitle* _title;
@@ -130,6 +136,7 @@ private:
     GtkButton* _save;
     GtkWidget* _modal = nullptr;
     GtkWidget* _page = nullptr;
+    WorkCover _work;
     std::function<void(const std::string&, const std::string&)> _leaf =
         [](const std::string& /*path*/, const std::string& /*text*/) {};
     Ref<GtkWidget> _detail; ///< beside the root pane

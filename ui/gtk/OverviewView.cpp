@@ -1,7 +1,7 @@
 #include "ui/gtk/OverviewView.h"
 
 #include "overview/StatusWords.h"
-#include "text/Date.h"
+#include "ui/contents/TimeOfDay.h"
 #include "ui/gtk/ShownText.h"
 #include "ui/gtk/Translation.h"
 
@@ -23,12 +23,6 @@ std::string joined(const std::vector<std::string>& words) {
         }
     }
     return text;
-}
-
-/// "22:14:06", so much ahead of UTC.
-std::string timeOfDay(Time time, std::chrono::seconds ahead) {
-    constexpr std::size_t kTimeOfDay = 11; // in "2023-11-14 22:14:06"
-    return localDateText(time, ahead).substr(kTimeOfDay);
 }
 
 } // namespace

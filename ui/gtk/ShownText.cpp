@@ -8,6 +8,12 @@ std::string shownText(std::string_view text) {
     return printable(text);
 }
 
+std::string shownLines(std::string_view text) {
+    std::string shown;
+    appendPrintableLines(shown, text);
+    return shown;
+}
+
 std::string shownMarkup(std::string_view text) {
     const std::string shown = shownText(text);
     gchar* escaped = g_markup_escape_text(shown.data(), static_cast<gssize>(shown.size()));

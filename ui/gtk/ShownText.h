@@ -9,6 +9,8 @@ namespace pallax::gtk {
 
 /// What a widget shows of a text: never a character that turns the direction of the text around it.
 std::string shownText(std::string_view text);
+/// The same for a text of several lines.
+std::string shownLines(std::string_view text);
 /// The same for a widget that takes markup.
 std::string shownMarkup(std::string_view text);
 

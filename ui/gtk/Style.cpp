@@ -23,6 +23,8 @@ constexpr const char* kStyle = R"(
 .pallax-headings { border-bottom: 1px solid @borders; }
 .pallax-heading { padding: 0; min-width: 0; min-height: 0; border-radius: 0; }
 .pallax-toolbar { border-top: 1px solid @borders; min-height: 34px; padding: 4px 10px; }
+.pallax-plot:focus-visible { outline: 2px solid @accent_color; }
+.pallax-span { padding-left: 8px; padding-right: 8px; min-width: 0; }
 .pallax-banner { padding: 4px 10px; background: alpha(@warning_bg_color, 0.3); }
 )";
 

@@ -66,21 +66,37 @@ void TimeBar::buildPlace() {
                translated("Go to a time, or to where a condition becomes true"));
     onSignal(_place, "activate", _guard,
              [this] { _actions.goTo(gtk_editable_get_text(GTK_EDITABLE(_place))); });
-    gtk_box_append(_box.get(), GTK_WIDGET(_place));
+    gtk_widget_set_hexpand(GTK_WIDGET(_place), TRUE);
+    auto* row = GTK_BOX(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, kGap));
+    gtk_box_append(row, GTK_WIDGET(_place));
+    (void)addButton(row, "bookmark-new-symbolic", translated("Mark"), Wish::Mark);
+    _changes = addButton(row, "view-dual-symbolic", translated("Changes since the Mark"),
+                         Wish::ShowChanges);
+    gtk_box_append(_box.get(), GTK_WIDGET(row));
+}
+
+/// Events above the scale, the marked instant below it.
+void TimeBar::showMarks(const State& state) {
+    if (state.events == _events && state.marked == _marked) {
+        return;
+    }
+    _events = state.events;
+    _marked = state.marked;
+    gtk_scale_clear_marks(_scale);
+    for (std::size_t event = 0; event < _events.size() && _events.size() <= kMostMarks; ++event) {
+        gtk_scale_add_mark(_scale, _events[event], GTK_POS_TOP, nullptr);
+    }
+    if (_marked) {
+        gtk_scale_add_mark(_scale, *_marked, GTK_POS_BOTTOM, nullptr);
+    }
 }
 
 void TimeBar::show(const State& state) {
     _isShowing = true;
     gtk_range_set_value(GTK_RANGE(_scale), state.share);
     _isShowing = false;
-    if (state.events != _events) {
-        _events = state.events;
-        gtk_scale_clear_marks(_scale);
-        for (std::size_t event = 0; event < _events.size() && _events.size() <= kMostMarks;
-             ++event) {
-            gtk_scale_add_mark(_scale, _events[event], GTK_POS_TOP, nullptr);
-        }
-    }
+    showMarks(state);
+    gtk_widget_set_sensitive(_changes, state.marked ? TRUE : FALSE);
     const bool moves = state.isPlaying || state.words.empty();
     gtk_button_set_icon_name(_hold, moves ? "media-playback-pause-symbolic"
                                           : "media-playback-start-symbolic");

@@ -5,6 +5,7 @@
 
 #include <functional>
 #include <gtk/gtk.h>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -21,6 +22,8 @@ public:
         EventBack,
         EventForward,
         ToPresent,
+        Mark,
+        ShowChanges, ///< since the mark
     };
     struct Actions {
         std::function<void(Wish)> wish;
@@ -34,7 +37,8 @@ public:
         std::string clock; ///< "22:14:06"
         double share = 1;
         bool isPlaying = false;
-        std::vector<double> events = {}; ///< the shares at which something happened
+        std::optional<double> marked = {}; ///< the share of the marked instant
+        std::vector<double> events = {};   ///< the shares at which something happened
     };
 
     TimeBar(const Guard& guard, Actions actions);
@@ -42,12 +46,15 @@ public:
     TimeBar& operator=(const TimeBar&) = delete;
 
     void show(const State& state);
+    /// Lets the user type a place.
+    void focusPlace() { gtk_widget_grab_focus(GTK_WIDGET(_place)); }
     GtkWidget* widget() const { return GTK_WIDGET(_box.get()); }
 
 private:
     GtkWidget* addButton(GtkBox* to, const char* icon, const char* name, Wish wish);
     void buildButtons(GtkBox* to);
     void buildPlace();
+    void showMarks(const State& state);
 
     Guard _guard;
     Actions _actions;
@@ -56,7 +63,9 @@ private:
     GtkLabel* _words;
     GtkButton* _hold = nullptr;
     GtkEntry* _place = nullptr;
-    std::vector<double> _events;
+    GtkWidget* _changes = nullptr;
+    std::vector<double> _events; ///< as they are shown, as `_marked`
+    std::optional<double> _marked;
     bool _isShowing = false; ///< the scale is being set by us
 };
 

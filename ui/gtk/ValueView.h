@@ -1,9 +1,12 @@
 #pragma once
 
-#include "timeline/Curve.h"
+#include "ui/gtk/CurvePlot.h"
 #include "ui/gtk/Ref.h"
+#include "ui/gtk/Signals.h"
+#include "ui/gtk/SpanChooser.h"
 
-#include <chrono>
+#include <cstddef>
+#include <functional>
 #include <gtk/gtk.h>
 #include <optional>
 #include <string>
@@ -11,21 +14,29 @@
 
 namespace pallax::gtk {
 
-/// The page of a value: what is known about it, and its curve.
+/// The page of a value: what is known about it, and its curve. Its texts change in place, so that
+/// the page keeps its place while time goes on.
 class ValueView {
 public:
+    struct Actions {
+        std::function<void(std::size_t span)> chooseSpan;
+        CurvePlot::Pointed pointed;
+        std::function<void()> toggleInGraph;
+        std::function<void()> openGraph;
+    };
     struct Content {
         std::string text;               ///< "-92.25 dBm"
-        std::string quality;            ///< "fair"; empty if it is not judged
+        std::string quality;            ///< "fair, 2 s old"; empty: nothing is known
         std::vector<std::string> lines; ///< what is known about it
-        std::optional<Curve> curve = {};
-        Time from = {}; ///< of the curve
-        Time to = {};
-        std::chrono::seconds ahead{0}; ///< local time minus UTC
-        std::string unit;
+        std::size_t span = 0;           ///< among curveSpans
+        std::optional<CurvePlot::Content> plot = {};
+        std::string statistics = {}; ///< of the curve
+        std::string last = {};       ///< its last value; empty: it has no points
+        std::string cursor = {};     ///< what the cursor is on; empty: there is none
+        bool isInGraph = false;
     };
 
-    ValueView();
+    ValueView(const Guard& guard, Actions actions);
     ValueView(const ValueView&) = delete;
     ValueView& operator=(const ValueView&) = delete;
 
@@ -33,22 +44,19 @@ public:
     GtkWidget* widget() const { return GTK_WIDGET(_scroller.get()); }
 
 private:
-    struct Extent {
-        double least;
-        double most;
-    };
+    void buildCurve(const Guard& guard, GtkBox* to);
 
-    std::optional<Extent> extent() const;
-    std::string rangeWords() const;
-    void draw(cairo_t* to, double width, double height) const;
-
-    Content _content;
+    Actions _actions;
+    CurvePlot _plot;
+    SpanChooser _spans;
     Ref<GtkScrolledWindow> _scroller;
     GtkLabel* _text; // the scroller owns it and what follows
     GtkLabel* _quality;
     GtkLabel* _facts;
-    GtkDrawingArea* _curve;
-    GtkLabel* _range;
+    GtkBox* _curve;
+    GtkLabel* _cursor;
+    GtkLabel* _statistics;
+    GtkButton* _graph;
 };
 
 } // namespace pallax::gtk

@@ -19,14 +19,14 @@ PageAnswer ChangesPage::handle(const KeyEvent& event) {
 }
 
 void ChangesPage::draw(const PageScreen& screen, const PageSurroundings& around) {
-    const Content& content = _source();
-    const PageFrame frame(screen, around, content.title);
-    const int lines = static_cast<int>(content.lines.size());
+    const ChangesContent& content = _source();
+    const PageFrame frame(screen, around, content.title());
+    const int lines = static_cast<int>(content.lines().size());
     _scrolling.fit(frame.rows(), lines);
     const int end = std::min(lines, _scrolling.first() + frame.rows());
     for (int line = _scrolling.first(); line < end; ++line) {
         const std::string text =
-            eventWords(content.lines[static_cast<std::size_t>(line)], screen.marks);
+            eventWords(content.lines()[static_cast<std::size_t>(line)], screen.marks);
         const bool isTitle = !text.starts_with(' ');
         const int y = kRowsAbove + line - _scrolling.first();
         const Span span = frame.span();

@@ -1,8 +1,7 @@
 #include "ui/pages/GraphPage.h"
 
-#include "overview/ValueFacts.h"
-#include "ui/drawing/TextWidth.h"
 #include "ui/drawing/Tints.h"
+#include "ui/pages/CurveKeys.h"
 #include "ui/pages/EventText.h"
 #include "ui/pages/PageTitle.h"
 
@@ -17,62 +16,21 @@ constexpr int kLeastPlotRows = 3;
 } // namespace
 
 PageAnswer GraphPage::handle(const KeyEvent& event) {
-    if (_keys.handle(event)) {
+    if (handleCurveKey(_reading, event)) {
         return PageAnswer::Handled;
     }
     const bool closes = event.key == Key::Character && event.character == U'V';
     return closes || goesBack(event) ? PageAnswer::Closes : PageAnswer::NotMine;
 }
 
-/// "a  -92.25 dBm  Measured RSRP, Serving Cell Measurements": now, or at the cursor.
-std::string GraphPage::legendOf(const LeafName& leaf, const FieldInfo& field,
-                                const PlotCurve& curve, const CurrentValues& values) const {
-    std::string value = "no value";
-    if (_keys.cursor()) {
-        if (const CurvePoint* point = pointAt(curve.curve, *_keys.cursor())) {
-            value = shortNumber(point->last);
-            value.append(field.unit.empty() ? "" : " ").append(field.unit);
-        }
-    } else if (const auto current = valueOf(values, leaf)) {
-        value = current->value.text();
+Plot GraphPage::plotOf(const GraphPlot& content) const {
+    const CurveWindow& window = _shown.window();
+    Plot plot{window.from, window.to,       _shown.time().ahead, content.unit,
+              {},          _shown.events(), _reading.cursor()};
+    for (const GraphCurve& each : content.curves) {
+        plot.curves.push_back({each.mark, each.curve, tintOfCurve(each.number)});
     }
-    std::string words = curve.mark + "  " + value + "  " + field.key;
-    words.append(field.key.empty() ? "" : ", ").append(leaf.entry);
-    return words.append(leaf.entry.empty() ? "" : ", ").append(field.section);
-}
-
-std::vector<GraphPage::Group> GraphPage::groups(int columns) {
-    _shown.update();
-    const CurveWindow window = _shown.choose(_keys.span());
-    const CurrentValues* values = _shown.values();
-    std::vector<Group> groups;
-    std::size_t shown = 0;
-    for (const LeafName& leaf : _graph.leaves()) {
-        const auto index = values != nullptr ? values->fields().named(leaf.field) : std::nullopt;
-        if (!index) {
-            continue; // of another technology
-        }
-        const FieldInfo& field = values->fields()[*index];
-        PlotCurve curve{std::string(1, static_cast<char>('a' + shown)),
-                        _shown.curve(leaf, static_cast<std::size_t>(columns)), tintOfCurve(shown)};
-        ++shown;
-        auto group = std::find_if(groups.begin(), groups.end(), [&field](const Group& each) {
-            return each.plot.unit == field.unit;
-        });
-        if (group == groups.end()) {
-            group = groups.insert(groups.end(), Group{{window.from,
-                                                       window.to,
-                                                       _shown.time().ahead,
-                                                       field.unit,
-                                                       {},
-                                                       _shown.events(),
-                                                       {}},
-                                                      {}});
-        }
-        group->legend.push_back(legendOf(leaf, field, curve, *values));
-        group->plot.curves.push_back(std::move(curve));
-    }
-    return groups;
+    return plot;
 }
 
 void GraphPage::draw(const PageScreen& screen, const PageSurroundings& around) {
@@ -82,13 +40,14 @@ void GraphPage::draw(const PageScreen& screen, const PageSurroundings& around) {
                   std::string(around.root).append(screen.marks.crumb) + "Graph");
     (void)bars.drawRule(kRowsAbove - 1, screen.marks.up, 0, Key::PageUp);
     const int columns = grid.columns() - 2 * kMargin;
-    std::vector<Group> shown = groups(columns);
-    if (shown.empty()) {
-        _keys.fit({}, {}, 0);
+    const std::vector<GraphPlot> contents =
+        graphPlots(_shown, _graph, _reading, static_cast<std::size_t>(columns));
+    if (contents.empty()) {
+        _reading.fit({}, {}, 0);
         grid.put(kMargin, kRowsAbove, "No values: v in a pane adds one.", {},
                  {kMargin, kMargin + columns});
     } else {
-        drawGroups(screen, std::move(shown));
+        drawPlots(screen, contents);
     }
     const int ruleRight =
         bars.drawRule(grid.rows() - kRowsBelow, screen.marks.down, 0, Key::PageDown);
@@ -97,42 +56,38 @@ void GraphPage::draw(const PageScreen& screen, const PageSurroundings& around) {
         {{"- + zoom", typed(U'+')}, {"V panes", typed(U'V')}, {"? help", typed(U'?')}});
 }
 
-void GraphPage::drawGroups(const PageScreen& screen, std::vector<Group> groups) {
+void GraphPage::drawPlots(const PageScreen& screen, const std::vector<GraphPlot>& contents) {
     Grid& grid = screen.grid;
     const Span room{kMargin, grid.columns() - kMargin};
     const int columns = room.right - room.left;
     const int end = grid.rows() - kRowsBelow - 1; // the row of the cursor's time
     int legends = 0;
     int labels = 0;
-    for (const Group& group : groups) {
-        legends += static_cast<int>(group.legend.size());
-        labels = std::max(labels, labelColumns(group.plot, grid.rows()));
+    for (const GraphPlot& content : contents) {
+        legends += static_cast<int>(content.curves.size());
+        labels = std::max(labels, labelColumns(plotOf(content), grid.rows()));
     }
-    const Plot& first = groups.front().plot;
-    const bool hasCurves = _shown.window().firstPacket <= _shown.window().lastPacket;
-    _keys.fit(first.from, first.to, hasCurves ? curveColumns(first, columns, labels) : 0);
-    const int rows = (end - kRowsAbove - legends) / static_cast<int>(groups.size());
+    const CurveWindow& window = _shown.window();
+    const bool hasCurves = _shown.hasCurves();
+    _reading.fit(window.from, window.to,
+                 hasCurves ? curveColumns(plotOf(contents.front()), columns, labels) : 0);
+    const int rows = (end - kRowsAbove - legends) / static_cast<int>(contents.size());
     int y = kRowsAbove;
-    for (Group& group : groups) {
-        for (std::size_t index = 0; index < group.legend.size() && y < end; ++index, ++y) {
-            const PlotCurve& curve = group.plot.curves[index];
-            grid.put(kMargin, y, group.legend[index], {}, room);
-            grid.put(kMargin, y, curve.mark, {.tint = curve.tint}, room);
+    for (const GraphPlot& content : contents) {
+        for (const GraphCurve& curve : content.curves) {
+            if (y < end) {
+                grid.put(kMargin, y, curve.mark + "  " + curve.value + "  " + curve.name, {}, room);
+                grid.put(kMargin, y, curve.mark, {.tint = tintOfCurve(curve.number)}, room);
+                ++y;
+            }
         }
         const int height = std::min(std::max(rows, kLeastPlotRows), end - y);
         if (hasCurves && height >= kLeastPlotRows) {
-            group.plot.cursor = _keys.cursor();
-            drawPlot(grid, screen.marks, group.plot, {kMargin, y, columns, height}, labels);
+            drawPlot(grid, screen.marks, plotOf(content), {kMargin, y, columns, height}, labels);
             y += height;
         }
     }
-    std::string words(hasCurves ? _keys.spanWords() : "There are no curves yet.");
-    if (_keys.cursor()) {
-        words = clockText(*_keys.cursor(), first.ahead);
-        const std::string event = _keys.wordsAtCursor(first.events);
-        words.append(event.empty() ? "" : "  ").append(event);
-    }
-    grid.put(kMargin, end, eventWords(std::move(words), screen.marks), {}, room);
+    grid.put(kMargin, end, eventWords(graphWords(_shown, _reading), screen.marks), {}, room);
 }
 
 } // namespace pallax::terminal

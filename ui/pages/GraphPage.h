@@ -1,11 +1,9 @@
 #pragma once
 
-#include "ui/pages/CurveKeys.h"
-#include "ui/pages/Graph.h"
+#include "ui/contents/GraphContent.h"
+#include "ui/drawing/Plot.h"
 #include "ui/pages/Page.h"
-#include "ui/pages/ShownValues.h"
 
-#include <string>
 #include <vector>
 
 namespace pallax::terminal {
@@ -20,20 +18,12 @@ public:
     void draw(const PageScreen& screen, const PageSurroundings& around);
 
 private:
-    /// A plot with the rows of its legend.
-    struct Group {
-        Plot plot;
-        std::vector<std::string> legend;
-    };
-
-    std::vector<Group> groups(int columns);
-    std::string legendOf(const LeafName& leaf, const FieldInfo& field, const PlotCurve& curve,
-                         const CurrentValues& values) const;
-    void drawGroups(const PageScreen& screen, std::vector<Group> groups);
+    Plot plotOf(const GraphPlot& content) const;
+    void drawPlots(const PageScreen& screen, const std::vector<GraphPlot>& contents);
 
     ShownValues& _shown;
     const Graph& _graph;
-    CurveKeys _keys;
+    CurveReading _reading;
 };
 
 } // namespace pallax::terminal

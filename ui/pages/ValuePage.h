@@ -1,13 +1,12 @@
 #pragma once
 
-#include "ui/pages/CurveKeys.h"
+#include "ui/contents/CurveReading.h"
+#include "ui/contents/ValueContent.h"
 #include "ui/pages/Page.h"
-#include "ui/pages/ShownValues.h"
 
 #include <functional>
 #include <optional>
 #include <string>
-#include <vector>
 
 namespace pallax::terminal {
 
@@ -35,21 +34,16 @@ public:
     void draw(const PageScreen& screen, const PageSurroundings& around);
 
 private:
-    struct Content;
-
-    Content content();
-    std::string title(std::string_view root, const Marks& marks, const Content& content) const;
-    std::string statistics(const Plot& plot, const Curve& curve, const FieldInfo& field) const;
-    std::string drawValue(const PageScreen& screen, const Content& content) const;
-    int drawFacts(const PageScreen& screen, const Content& content) const;
-    void drawCurve(const PageScreen& screen, const Content& content, int top);
+    std::string title(std::string_view root, const Marks& marks) const;
+    std::string drawValue(const PageScreen& screen) const;
+    int drawFacts(const PageScreen& screen) const;
+    void drawCurve(const PageScreen& screen, int top);
 
     ShownValues& _shown;
     PaneLeaf _leaf;
     ValueActions _actions;
-    std::optional<LeafName> _name; ///< once the leaf is found among the values
-    std::string _text;             ///< the latest
-    CurveKeys _keys;
+    ValueContent _content;
+    CurveReading _reading;
 };
 
 } // namespace pallax::terminal

@@ -1,6 +1,7 @@
 #include "ui/terminal/FrontEnd.h"
 
 #include "ui/pages/EventText.h"
+#include "ui/contents/TravelWords.h"
 #include "ui/pages/Overlays.h"
 #include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/PaneView.h"
@@ -300,9 +301,9 @@ bool FrontEnd::handleTime(const KeyEvent& event) {
 
 void FrontEnd::openChanges() {
     if (!_time.hasMark()) {
-        return setMessage("Mark an instant first, with the key m.");
+        return setMessage(kNothingMarked);
     }
-    _pages.open(ChangesPage([this]() -> const ChangesPage::Content& { return _time.changes(); }));
+    _pages.open(ChangesPage([this]() -> const ChangesContent& { return _time.changes(); }));
     needsDisplay();
 }
 

@@ -1,6 +1,8 @@
 #pragma once
 
 #include "timeline/Moment.h"
+#include "ui/contents/Graph.h"
+#include "ui/contents/ShownValues.h"
 #include "ui/contents/TextFinder.h"
 #include "ui/drawing/Grid.h"
 #include "ui/drawing/HitMap.h"
@@ -8,10 +10,8 @@
 #include "ui/drawing/LineEditor.h"
 #include "ui/drawing/Marks.h"
 #include "ui/drawing/Origin.h"
-#include "ui/pages/Graph.h"
 #include "ui/pages/HelpPage.h"
 #include "ui/pages/Pages.h"
-#include "ui/pages/ShownValues.h"
 #include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/TerminalToolkit.h"
 #include "ui/terminal/TimeControl.h"

@@ -1,9 +1,8 @@
 #include "ui/terminal/TimeControl.h"
 
-#include "overview/DifferenceText.h"
+#include "ui/contents/TravelWords.h"
 
 #include <utility>
-#include <vector>
 
 namespace pallax::terminal {
 
@@ -13,16 +12,6 @@ using Direction = Travel::Direction;
 
 constexpr std::chrono::minutes kLongStep{1};
 constexpr Hint kLeavePrompt{"Enter go  Esc leave", {.key = Key::Escape}};
-
-std::vector<std::string> linesOf(const std::string& text) {
-    std::vector<std::string> lines;
-    for (std::size_t begin = 0; begin < text.size();) {
-        const std::size_t end = std::min(text.find('\n', begin), text.size());
-        lines.push_back(text.substr(begin, end - begin));
-        begin = end + 1;
-    }
-    return lines;
-}
 
 } // namespace
 
@@ -82,26 +71,16 @@ std::optional<Travel::Refusal> TimeControl::act(char32_t character) {
     case U'N':
         return to.findAgain(Direction::Back);
     case U'm':
-        return setMark();
+        return markShown(to);
     case U'(':
         to.slower();
-        return tellSpeed();
+        return speedWords(to);
     case U')':
         to.faster();
-        return tellSpeed();
+        return speedWords(to);
     default:
         return std::nullopt;
     }
-}
-
-Travel::Refusal TimeControl::setMark() {
-    const Travel::Refusal refusal = travel()->mark();
-    return refusal ? refusal
-                   : "Marked " + travel()->clock(*travel()->marked()) + ". d shows what differs.";
-}
-
-Travel::Refusal TimeControl::tellSpeed() {
-    return (isAway() ? "Playing speed " : "What is held will play at ") + travel()->speedText();
 }
 
 void TimeControl::tell(const Travel::Refusal& refusal) {
@@ -129,8 +108,7 @@ void TimeControl::forget() {
     if (_panes) {
         _panes->forget();
     }
-    _compared.reset();
-    _changes = {};
+    _changes.forget();
 }
 
 std::optional<Prompt> TimeControl::prompt() const {
@@ -165,27 +143,8 @@ std::optional<TimeBar> TimeControl::bar() const {
     return bar;
 }
 
-const ChangesPage::Content& TimeControl::changes() {
-    const Moment moment = travel()->moment();
-    const auto marked = travel()->marked();
-    if (moment.timeline == nullptr || !marked) {
-        _changes = {"Changes", {"No instant is marked."}};
-        return _changes;
-    }
-    const std::uint64_t from = std::max(*marked, moment.timeline->firstInstant());
-    const auto compared = std::pair(from, moment.instant);
-    if (_compared != compared) {
-        _compared = compared;
-        std::string text;
-        appendDifferencesText(text, differencesBetween(moment.timeline->valuesAt(from),
-                                                       moment.timeline->valuesAt(moment.instant)));
-        _changes = {"Changes from " + travel()->clock(from) + " to " +
-                        travel()->clock(moment.instant),
-                    linesOf(text)};
-        if (!_changes.lines.empty()) { // an empty line is above the first section
-            _changes.lines.erase(_changes.lines.begin());
-        }
-    }
+const ChangesContent& TimeControl::changes() {
+    _changes.update(*travel());
     return _changes;
 }
 

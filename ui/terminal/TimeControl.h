@@ -2,12 +2,11 @@
 
 #include "travel/InstantPanes.h"
 #include "travel/Travel.h"
+#include "ui/contents/ChangesContent.h"
 #include "ui/drawing/Bars.h"
 #include "ui/drawing/LineEditor.h"
-#include "ui/pages/ChangesPage.h"
 #include "ui/terminal/TerminalNavigation.h"
 
-#include <cstdint>
 #include <functional>
 #include <optional>
 #include <string>
@@ -39,8 +38,8 @@ public:
     TerminalNavigation* panes(const TerminalNavigation& live);
     std::optional<Prompt> prompt() const;
     std::optional<TimeBar> bar() const;
-    /// What has changed since the mark.
-    const ChangesPage::Content& changes();
+    /// What has changed since the mark; only while there is a mark.
+    const ChangesContent& changes();
 
     /// The timeline is another one.
     void forget();
@@ -52,14 +51,11 @@ private:
     void handleTyping(const KeyEvent& event);
     std::optional<Travel::Refusal> act(char32_t character);
     void tell(const Travel::Refusal& refusal);
-    Travel::Refusal setMark();
-    Travel::Refusal tellSpeed();
 
     Surroundings _surroundings;
     std::optional<LineEditor> _typed;
     std::optional<InstantPanes> _panes; ///< nothing if there is only the present
-    ChangesPage::Content _changes;
-    std::optional<std::pair<std::uint64_t, std::uint64_t>> _compared; ///< whose changes are known
+    ChangesContent _changes;
 };
 
 } // namespace pallax::terminal

@@ -1,6 +1,6 @@
 #include "ui/drawing/Tints.h"
 
-#include "ui/pages/Graph.h"
+#include "ui/contents/Graph.h"
 
 #include <gtest/gtest.h>
 

@@ -30,6 +30,8 @@ button: Next event
 button: To the present
 text: 22:14:06, held, 12 s behind
 field: ""
+button: Mark
+button: Changes since the Mark (off)
 )"),
               std::string::npos)
         << stage.dump();
@@ -37,6 +39,11 @@ field: ""
     stage.press("Play");
     stage.press("Next event");
     EXPECT_EQ(wishes, (std::vector{TimeBar::Wish::HoldOrPlay, TimeBar::Wish::EventForward}));
+    stage.press("Mark");
+    EXPECT_EQ(wishes.back(), TimeBar::Wish::Mark);
+    bar.show({.words = "", .clock = "22:14:06", .share = 0.25, .marked = 0.25});
+    stage.press("Changes since the Mark");
+    EXPECT_EQ(wishes.back(), TimeBar::Wish::ShowChanges);
     gtk_range_set_value(GTK_RANGE(WindowStage::below(bar.widget(), GTK_TYPE_SCALE)), 0.75);
     EXPECT_EQ(shares, std::vector{0.75});
 }

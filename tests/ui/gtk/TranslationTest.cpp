@@ -1,5 +1,6 @@
 #include "tests/doubles/Files.h"
 #include "tests/doubles/Pattern.h"
+#include "ui/contents/CurveReading.h"
 
 #include <gtest/gtest.h>
 
@@ -27,6 +28,9 @@ std::set<std::string> textsOfTheSources() {
                 }
             }
         }
+    }
+    for (const CurveSpan& span : curveSpans()) { // translated where they are shown
+        texts.insert(std::string(span.words));
     }
     return texts;
 }

@@ -1,97 +1,170 @@
 #include "ui/gtk/ValueView.h"
 
+#include "tests/ui/gtk/CurveSamples.h"
 #include "tests/ui/gtk/WindowStage.h"
 #include "tests/ui/gtk/XDisplay.h"
 
 namespace pallax::gtk {
 namespace {
 
-using namespace std::chrono_literals;
+class ValueViewTest : public DisplayTest {};
 
-class ValueViewTest : public DisplayTest {
-protected:
+/// A window with what is tested.
+struct ValueViewStage {
     static ValueView::Content content() {
-        Curve curve;
-        curve.points = {{Time{10s}, -94, -101.5, -90, -92}, {Time{12s}, -92, -92, -82.25, -85}};
-        curve.gap = 5s;
         return {.text = "-92.25 dBm <b>",
-                .quality = "fair",
+                .quality = "fair · 2 s old",
                 .lines = {"A sentence.", "", "/Section/RSRP"},
-                .curve = curve,
-                .from = Time{10s},
-                .to = Time{70s},
-                .ahead = 1h,
-                .unit = "dBm"};
+                .span = 2,
+                .plot = samplePlot(),
+                .statistics = "-101.5 … -82.25 dBm, 01:00:10 – 01:01:10",
+                .last = "-85 dBm"};
     }
+    void open(const ValueView::Content& shown) {
+        view.show(shown);
+        stage.frame.openPage(view.widget(), "RSRP");
+        stage.settle();
+    }
+    ~ValueViewStage() { stage.frame.closePage(); }
+
+    WindowStage stage{360, 720};
+    std::vector<std::string> done;
+    ValueView view{
+        stage.guard,
+        {.chooseSpan = [this](std::size_t span) { done.push_back("span " + std::to_string(span)); },
+         .pointed = [this](auto time) { done.emplace_back(time ? "pointed" : "left"); },
+         .toggleInGraph = [this] { done.emplace_back("toggle"); },
+         .openGraph = [this] { done.emplace_back("open"); }}};
 };
 
-TEST_F(ValueViewTest, IsAPageOverThePanesUntilTheUserGoesBack) {
-    WindowStage stage(360, 720);
-    stage.tick(Dictionary{{"RSRP", "-92.25 dBm"}});
-    const std::string panes = stage.dump();
-    ValueView view;
-    view.show(content());
-    stage.frame.openPage(view.widget(), "RSRP");
-    stage.settle();
-    EXPECT_EQ(stage.dump(), R"(
+constexpr const char* kValuePage = R"(
 button: Back (focus)
 title: RSRP / 
 text: -92.25 dBm <b>
-text: fair
+text: fair · 2 s old
+button: 30 s
+button: 60 s
+button: 5 min (on)
+button: 15 min
+button: 60 min
+button: All
 text: -101.5 … -82.25 dBm, 01:00:10 – 01:01:10
+button: Add to the Graph
+button: Open the Graph
 text: A sentence.
 /Section/RSRP
-)");
-    EXPECT_TRUE(stage.frame.isPageOpen());
-    stage.press("Back");
-    EXPECT_FALSE(stage.frame.isPageOpen());
-    EXPECT_EQ(stage.dump(), panes);
-    stage.frame.openPage(view.widget(), "RSRP"); // again
-    stage.settle();
-    EXPECT_NE(stage.dump().find("A sentence."), std::string::npos);
-    stage.frame.closePage();
+)";
+
+TEST_F(ValueViewTest, IsAPageOverThePanesUntilTheUserGoesBack) {
+    ValueViewStage tested;
+    tested.stage.tick(Dictionary{{"RSRP", "-92.25 dBm"}});
+    const std::string panes = tested.stage.dump();
+    tested.open(tested.content());
+    EXPECT_EQ(tested.stage.dump(), kValuePage);
+    EXPECT_TRUE(tested.stage.frame.isPageOpen());
+    tested.stage.press("Back");
+    EXPECT_FALSE(tested.stage.frame.isPageOpen());
+    EXPECT_EQ(tested.stage.dump(), panes);
+    tested.stage.frame.openPage(tested.view.widget(), "RSRP"); // again
+    tested.stage.settle();
+    EXPECT_NE(tested.stage.dump().find("A sentence."), std::string::npos);
 }
 
-TEST_F(ValueViewTest, TheCurveHasAName) {
-    ValueView view;
-    view.show(content());
-    char* fault = gtk_test_accessible_check_property(
-        GTK_ACCESSIBLE(WindowStage::below(view.widget(), GTK_TYPE_DRAWING_AREA)),
-        GTK_ACCESSIBLE_PROPERTY_LABEL, "Curve: -101.5 … -82.25 dBm, 01:00:10 – 01:01:10");
-    EXPECT_EQ(fault, nullptr) << fault;
-    g_free(fault);
+TEST_F(ValueViewTest, IsTheSameOnADesktop) {
+    ValueViewStage tested;
+    tested.stage.resize(1024, 768);
+    tested.open(tested.content());
+    EXPECT_EQ(tested.stage.dump(), kValuePage);
+}
+
+TEST_F(ValueViewTest, TellsWhatTheUserWants) {
+    ValueViewStage tested;
+    tested.open(tested.content());
+    tested.stage.press("all time");
+    tested.stage.press("Add to the Graph");
+    tested.stage.press("Open the Graph");
+    EXPECT_EQ(tested.done, (std::vector<std::string>{"span 5", "toggle", "open"}));
+    ValueView::Content next = tested.content();
+    next.isInGraph = true;
+    tested.view.show(next);
+    tested.stage.press("Remove from the Graph");
+    EXPECT_EQ(tested.done.back(), "toggle");
+}
+
+TEST_F(ValueViewTest, ShowsWhatTheCursorIsOnInPlaceOfAnEmptyLine) {
+    ValueViewStage tested;
+    tested.open(tested.content());
+    const auto heightOfPage = [&tested] {
+        tested.stage.settle();
+        return gtk_adjustment_get_upper(
+            gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(tested.view.widget())));
+    };
+    const double height = heightOfPage();
+    ValueView::Content read = tested.content();
+    read.cursor = "01:00:40  -85 dBm";
+    tested.view.show(read);
+    EXPECT_EQ(heightOfPage(), height) << "nothing moves";
+    EXPECT_NE(tested.stage.dump().find("text: 01:00:40  -85 dBm\n"), std::string::npos);
+}
+
+TEST_F(ValueViewTest, TheCurveHasANameWithItsRangeAndLastValue) {
+    ValueViewStage tested;
+    tested.open(tested.content());
+    const auto plots = plotsBelow(tested.view.widget());
+    ASSERT_EQ(plots.size(), 1U);
+    EXPECT_EQ(
+        faultOfName(plots[0], "Curve: -101.5 … -82.25 dBm, 01:00:10 – 01:01:10, last -85 dBm"), "");
+}
+
+TEST_F(ValueViewTest, HoldsItsPlaceWhileTimeGoesOn) {
+    ValueViewStage tested;
+    tested.stage.resize(360, 300);
+    tested.open(tested.content());
+    GtkAdjustment* down =
+        gtk_scrolled_window_get_vadjustment(GTK_SCROLLED_WINDOW(tested.view.widget()));
+    gtk_adjustment_set_value(down, 150);
+    GtkWidget* text = WindowStage::below(tested.view.widget(), GTK_TYPE_LABEL);
+    gtk_label_select_region(GTK_LABEL(text), 0, 6);
+    ValueView::Content next = tested.content();
+    next.quality = "good · 4 s old";
+    next.plot->to += std::chrono::seconds(2);
+    tested.view.show(next);
+    tested.stage.settle();
+    EXPECT_EQ(gtk_adjustment_get_value(down), 150);
+    int begin = 0;
+    int end = 0;
+    EXPECT_NE(gtk_label_get_selection_bounds(GTK_LABEL(text), &begin, &end), FALSE)
+        << "what is selected stays so while the text is the same";
+    EXPECT_EQ(end, 6);
+    EXPECT_NE(tested.stage.dump().find("text: good · 4 s old"), std::string::npos);
 }
 
 TEST_F(ValueViewTest, WithoutNumbersThereIsNoCurve) {
-    ValueView::Content none = content();
-    none.curve.reset();
+    ValueViewStage tested;
+    ValueView::Content none = tested.content();
+    none.plot.reset();
     none.text.clear();
-    ValueView view;
-    view.show(none);
-    WindowStage stage(360, 720);
-    stage.frame.openPage(view.widget(), "State");
-    stage.settle();
-    EXPECT_EQ(stage.dump(), R"(
+    tested.open(none);
+    EXPECT_EQ(tested.stage.dump(), R"(
 button: Back (focus)
-title: State / 
+title: RSRP / 
 text: no value now
-text: fair
+text: fair · 2 s old
 text: A sentence.
 /Section/RSRP
 )");
-    stage.frame.closePage();
 }
 
 TEST_F(ValueViewTest, ALeafThatIsSelectedIsToldWithItsPath) {
-    WindowStage stage(360, 720);
-    stage.tick(Dictionary{{"Section", Dictionary{{"RSRP", "-92.25 dBm"}}}});
+    ValueViewStage tested;
+    tested.stage.tick(Dictionary{{"Section", Dictionary{{"RSRP", "-92.25 dBm"}}}});
     std::vector<std::string> told;
-    stage.frame.onLeaf([&](const std::string& path, const std::string& text) {
+    tested.stage.frame.onLeaf([&](const std::string& path, const std::string& text) {
         told = {path, text};
     });
-    stage.select(0);
+    tested.stage.select(0);
     EXPECT_TRUE(told.empty()) << "a branch opens a pane";
-    stage.select(0);
+    tested.stage.select(0);
     EXPECT_EQ(told, (std::vector<std::string>{"/Section/RSRP", "-92.25 dBm"}));
 }
 

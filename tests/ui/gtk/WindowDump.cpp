@@ -87,6 +87,11 @@ private:
                         (label != nullptr     ? label
                          : tooltip != nullptr ? tooltip
                                               : "?") +
+                        (GTK_IS_TOGGLE_BUTTON(widget) != FALSE &&
+                                 gtk_toggle_button_get_active(GTK_TOGGLE_BUTTON(widget)) != FALSE
+                             ? " (on)"
+                             : "") +
+                        (gtk_widget_get_sensitive(widget) == FALSE ? " (off)" : "") +
                         (gtk_widget_has_focus(widget) != FALSE ? " (focus)" : ""));
         }
         if (GTK_IS_EDITABLE(widget)) {

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-namespace pallax::terminal {
+namespace pallax {
 
 /// A range of values whose ends and labels are round numbers.
 struct ValueAxis {
@@ -31,7 +31,4 @@ struct TimeLabel {
 /// room in `columns` columns.
 std::vector<TimeLabel> timeLabels(Time from, Time to, std::chrono::seconds ahead, int columns);
 
-/// "22:09:30": the local time of day.
-std::string clockText(Time time, std::chrono::seconds ahead);
-
-} // namespace pallax::terminal
+} // namespace pallax

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-namespace pallax::terminal {
+namespace pallax {
 
 /// The values whose curves the graph page shows.
 class Graph {
@@ -15,10 +15,11 @@ public:
 
     /// Adds a value or, if it is there, takes it away. Returns a sentence about it.
     std::string toggle(const LeafName& leaf);
+    bool contains(const LeafName& leaf) const;
     const std::vector<LeafName>& leaves() const { return _leaves; }
 
 private:
     std::vector<LeafName> _leaves;
 };
 
-} // namespace pallax::terminal
+} // namespace pallax

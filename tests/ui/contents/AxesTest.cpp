@@ -1,10 +1,10 @@
-#include "ui/drawing/Axes.h"
+#include "ui/contents/Axes.h"
 
 #include <gtest/gtest.h>
 
 #include <string>
 
-namespace pallax::terminal {
+namespace pallax {
 namespace {
 
 using std::chrono::hours;
@@ -77,4 +77,4 @@ TEST(TimeLabels, AreMissingWhereThereIsNoRoom) {
 }
 
 } // namespace
-} // namespace pallax::terminal
+} // namespace pallax

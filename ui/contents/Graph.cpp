@@ -1,10 +1,14 @@
-#include "ui/pages/Graph.h"
+#include "ui/contents/Graph.h"
 
 #include "text/Format.h"
 
 #include <algorithm>
 
-namespace pallax::terminal {
+namespace pallax {
+
+bool Graph::contains(const LeafName& leaf) const {
+    return std::find(_leaves.begin(), _leaves.end(), leaf) != _leaves.end();
+}
 
 std::string Graph::toggle(const LeafName& leaf) {
     const auto found = std::find(_leaves.begin(), _leaves.end(), leaf);
@@ -19,4 +23,4 @@ std::string Graph::toggle(const LeafName& leaf) {
     return formatText("In the graph (%u of %u): V opens it.", {_leaves.size(), kMost});
 }
 
-} // namespace pallax::terminal
+} // namespace pallax

@@ -1,17 +1,17 @@
-#include "ui/drawing/Axes.h"
+#include "ui/contents/Axes.h"
 
 #include "text/NumberFormat.h"
+#include "ui/contents/TimeOfDay.h"
 
 #include <algorithm>
 #include <array>
 #include <cmath>
 
-namespace pallax::terminal {
+namespace pallax {
 
 namespace {
 
-constexpr std::size_t kClockAt = 11; // in "2023-11-14 22:14:06"
-constexpr std::size_t kMinutes = 5;  // the length of "22:14"
+constexpr std::size_t kMinutes = 5; // the length of "22:14"
 
 constexpr auto kTimeSteps =
     std::to_array<int>({1,   2,    5,    10,   15,    30,    60,    120,   300,    600,
@@ -62,10 +62,6 @@ ValueAxis valueAxis(double least, double most, int count) {
     return axis;
 }
 
-std::string clockText(Time time, std::chrono::seconds ahead) {
-    return localDateText(time, ahead).substr(kClockAt);
-}
-
 std::vector<TimeLabel> timeLabels(Time from, Time to, std::chrono::seconds ahead, int columns) {
     using std::chrono::seconds;
     constexpr int kBetween = 4;
@@ -90,10 +86,10 @@ std::vector<TimeLabel> timeLabels(Time from, Time to, std::chrono::seconds ahead
         if (time > to) {
             return labels;
         }
-        std::string text = clockText(time, ahead);
+        std::string text = timeOfDay(time, ahead);
         text.resize(*step < kMinute ? text.size() : kMinutes);
         labels.push_back({time, std::move(text)});
     }
 }
 
-} // namespace pallax::terminal
+} // namespace pallax

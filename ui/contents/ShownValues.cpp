@@ -1,8 +1,8 @@
-#include "ui/pages/ShownValues.h"
+#include "ui/contents/ShownValues.h"
 
 #include <algorithm>
 
-namespace pallax::terminal {
+namespace pallax {
 
 namespace {
 
@@ -102,8 +102,8 @@ std::optional<EntryId> ShownValues::entryOf(FieldIndex field, const LeafName& le
     return std::nullopt;
 }
 
-std::vector<PlotEvent> ShownValues::events() const {
-    std::vector<PlotEvent> shown;
+std::vector<CurveEvent> ShownValues::events() const {
+    std::vector<CurveEvent> shown;
     if (_moment.timeline == nullptr) {
         return shown;
     }
@@ -115,4 +115,4 @@ std::vector<PlotEvent> ShownValues::events() const {
     return shown;
 }
 
-} // namespace pallax::terminal
+} // namespace pallax

@@ -6,7 +6,6 @@
 #include "timeline/LeafField.h"
 #include "timeline/Moment.h"
 #include "timeline/Reading.h"
-#include "ui/drawing/Plot.h"
 
 #include <chrono>
 #include <functional>
@@ -16,7 +15,7 @@
 #include <string_view>
 #include <vector>
 
-namespace pallax::terminal {
+namespace pallax {
 
 /// The time of what is shown.
 struct DisplayTime {
@@ -62,9 +61,11 @@ public:
     /// was chosen last. Without a timeline it has no packets.
     const CurveWindow& choose(std::optional<std::chrono::seconds> span);
     const CurveWindow& window() const { return _window; }
+    /// Whether that window has packets.
+    bool hasCurves() const { return _window.firstPacket <= _window.lastPacket; }
     /// At least `count` points, if there are so many numbers.
     const Curve& curve(const LeafName& leaf, std::size_t count);
-    std::vector<PlotEvent> events() const;
+    std::vector<CurveEvent> events() const;
 
 private:
     std::optional<EntryId> entryOf(FieldIndex field, const LeafName& leaf) const;
@@ -81,4 +82,4 @@ private:
     std::map<std::string, Curve> _curves;
 };
 
-} // namespace pallax::terminal
+} // namespace pallax

@@ -1,10 +1,10 @@
-#include "ui/pages/ShownValues.h"
+#include "ui/contents/ShownValues.h"
 
-#include "tests/ui/pages/ValueStage.h"
+#include "tests/timeline/TimelineFixture.h"
 
 #include <gtest/gtest.h>
 
-namespace pallax::terminal {
+namespace pallax {
 namespace {
 
 class ShownValuesTest : public testing::Test {
@@ -75,4 +75,4 @@ TEST_F(ShownValuesTest, EventsAreThoseOfTheWindow) {
 }
 
 } // namespace
-} // namespace pallax::terminal
+} // namespace pallax

@@ -1,0 +1,116 @@
+#include "window/LongWork.h"
+
+#include "tests/ui/gtk/WindowDump.h"
+#include "tests/ui/gtk/XDisplay.h"
+#include "window/GlibTurns.h"
+
+#include <chrono>
+#include <functional>
+
+namespace pallax {
+namespace {
+
+using namespace std::chrono_literals;
+using Clock = std::chrono::steady_clock;
+
+class LongWorkTest : public gtk::DisplayTest {};
+
+/// A window in which work asks whether it may go on.
+struct Working {
+    Working() { gtk_window_present(frame.window()); }
+
+    /// Runs the work as a block, and until the blocks after it have run.
+    void run(const std::function<void()>& block) {
+        work->begin([this, block] {
+            block();
+            queue.async([this] { queue.stop(); });
+        });
+        turns.run();
+    }
+    /// Asks for so long, or until it may not go on; whether it was stopped.
+    bool isStopped(std::chrono::milliseconds length) {
+        const auto end = Clock::now() + length;
+        while (Clock::now() < end) {
+            if (!work->mayGoOn("Working. Esc stops.")) {
+                return true;
+            }
+        }
+        return false;
+    }
+    bool isTold() const { return dump().find("Working. Esc stops.") != std::string::npos; }
+    std::string dump() const { return gtk::windowDump(GTK_WIDGET(frame.window())); }
+
+    AsioMainQueue queue;
+    GlibTurns turns{queue};
+    gtk::Guard guard{queue};
+    int closings = 0;
+    gtk::MainFrame frame{nullptr, guard, {[this] { ++closings; }}};
+    std::unique_ptr<LongWork> work = std::make_unique<LongWork>(queue, frame);
+};
+
+/// Calls the function once, from the toolkit's loop.
+void onceFromToolkit(guint delay, const std::function<void()>& action) {
+    g_timeout_add_full(
+        G_PRIORITY_DEFAULT, delay,
+        +[](gpointer data) -> gboolean {
+            (*static_cast<std::function<void()>*>(data))();
+            return G_SOURCE_REMOVE;
+        },
+        new std::function<void()>(action),
+        +[](gpointer data) { delete static_cast<std::function<void()>*>(data); });
+}
+
+TEST_F(LongWorkTest, OfShortWorkNothingIsToldAndNothingIsLeft) {
+    Working window;
+    window.run([&] {
+        EXPECT_FALSE(window.isStopped(30ms));
+        EXPECT_FALSE(window.isTold());
+    });
+    EXPECT_FALSE(window.isTold());
+}
+
+TEST_F(LongWorkTest, TheToolkitIsServedButNoOtherBlockRuns) {
+    Working window;
+    bool isServed = false;
+    bool hasBlockRun = false;
+    window.run([&] {
+        onceFromToolkit(1, [&] { isServed = true; });
+        window.queue.async([&] { hasBlockRun = true; });
+        EXPECT_FALSE(window.isStopped(300ms));
+        EXPECT_TRUE(window.isTold());
+        EXPECT_TRUE(isServed);
+        EXPECT_FALSE(hasBlockRun);
+    });
+    EXPECT_TRUE(hasBlockRun);
+    EXPECT_FALSE(window.isTold()) << "it is over";
+}
+
+TEST_F(LongWorkTest, TheUserStopsItAndTheNextWorkBeginsAfresh) {
+    Working window;
+    for (int times = 0; times < 2; ++times) {
+        window.run([&] {
+            onceFromToolkit(150, [&] {
+                gboolean isHandled = FALSE;
+                g_signal_emit_by_name(window.frame.window(), "close-request", &isHandled);
+            });
+            const auto begin = Clock::now();
+            EXPECT_TRUE(window.isStopped(10s));
+            EXPECT_LT(Clock::now() - begin, 5s);
+        });
+        EXPECT_FALSE(window.isTold());
+    }
+    EXPECT_EQ(window.closings, 2);
+}
+
+TEST_F(LongWorkTest, WorkThatWaitsIsDroppedWithTheObject) {
+    Working window;
+    bool hasRun = false;
+    window.work->begin([&] { hasRun = true; });
+    window.work.reset();
+    window.queue.async([&] { window.queue.stop(); });
+    window.turns.run();
+    EXPECT_FALSE(hasRun);
+}
+
+} // namespace
+} // namespace pallax
