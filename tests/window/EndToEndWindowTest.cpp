@@ -173,6 +173,23 @@ TEST_F(EndToEndWindow, ALongSearchTellsHowFarItIsAndIsCancelled) {
                            "press 'To the present' lacks '22:13:20, held*'"));
 }
 
+TEST_F(EndToEndWindow, TheSettingsSayHowListsAreShownFirst) {
+    std::filesystem::create_directories(world.path("config/pallax"));
+    std::ofstream(world.path("config/pallax/pallax.conf")) << "lists = table\n";
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' open 'Neighbor Cells List, 2' "
+                       "has 'Physical Cell ID 184, *' has 'Show as Rows'"));
+}
+
+TEST_F(EndToEndWindow, ALongQueryIsToldAndStopped) {
+    expectDriven(
+        drive(sample("lte-drive.pcap") + " --speed max",
+              "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key ';' "
+              "type 'Question in SQL=with recursive n(i) as (select 1 union all select i + 1 from "
+              "n) select count(*) from n' key Return has 'The query is running.' press Cancel "
+              "has 'The query was stopped.' key Escape lacks 'The query was stopped.'"));
+}
+
 TEST_F(EndToEndWindow, SpeaksGermanButKeepsTheModemsTexts) {
     if (!std::filesystem::exists(PALLAX_BINARY_DIR "/locale")) {
         GTEST_SKIP() << "gettext is not installed";

@@ -34,8 +34,8 @@ protected:
         settle();
     }
     void find(const std::string& text) {
+        gtk_search_entry_set_search_delay(GTK_SEARCH_ENTRY(field(view->widget())), 0);
         gtk_editable_set_text(field(view->widget()), text.c_str());
-        g_signal_emit_by_name(field(view->widget()), "search-changed");
         settle();
     }
 

@@ -193,6 +193,21 @@ cells (cursor) (focus): 285 | -97.00 | measured | 2 ›
     EXPECT_NE(dump().find("cells (cursor) (focus): 252"), std::string::npos) << dump();
 }
 
+TEST_F(TableViewTest, ARowThatMovesKeepsItsWidgetAndTheKeyboard) {
+    open(1024, 768);
+    view->focusCursor();
+    stage->settle();
+    GtkWidget* const focused = gtk_window_get_focus(stage->frame.window());
+    TableContent reversed = cells();
+    std::swap(reversed.rows.front(), reversed.rows.back());
+    view->model().update(reversed, TableModel::Changes::Ignore);
+    view->refresh();
+    EXPECT_EQ(gtk_window_get_focus(stage->frame.window()), focused) << "at once";
+    stage->settle();
+    EXPECT_EQ(gtk_window_get_focus(stage->frame.window()), focused);
+    EXPECT_NE(dump().find("cells (cursor) (focus): 184"), std::string::npos) << dump();
+}
+
 TEST_F(TableViewTest, AChosenRowIsOpened) {
     open(360, 720);
     activate(2);
