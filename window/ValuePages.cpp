@@ -51,6 +51,15 @@ void ValuePages::openGraph() {
     _frame.openPage(_graphView.widget(), gtk::translated("Graph"));
 }
 
+void ValuePages::clear() {
+    if (isValueOpen() || isGraphOpen()) {
+        _frame.closePage();
+    }
+    _graph = {};
+    _content.reset();
+    _rowText.clear();
+}
+
 void ValuePages::update() {
     if (isValueOpen()) {
         showValue();

@@ -34,6 +34,8 @@ public:
     }
     /// The timeline is another one.
     void forget() { _values.forget(); }
+    /// Other values may be shown from now on: forgets which were, also in the graph.
+    void clear();
     /// The keys of the page that is open, the same as on a terminal, and V; false for any other.
     bool handleKey(guint key);
 

@@ -238,6 +238,7 @@ void WindowSession::toggleSafe() {
             gtk::translated("A stream can be played only once: start the viewer with --safe."));
     }
     _isSafe = !_isSafe;
+    _pages.clear();
     forgetInstant();
     _tables.forget();
     _viewer.setSafe(_isSafe);

@@ -21,6 +21,17 @@ std::vector<std::string> linesOf(const std::string& text) {
 
 } // namespace
 
+ChangeParts changeParts(std::string_view line) {
+    constexpr std::string_view kGap = "  "; // or more, between the columns
+    ChangeParts parts;
+    parts.depth = std::min(line.find_first_not_of(' '), line.size());
+    const std::string_view text = line.substr(parts.depth);
+    const std::size_t gap = std::min(text.find(kGap), text.size());
+    parts.name = text.substr(0, gap);
+    parts.change = text.substr(std::min(text.find_first_not_of(' ', gap), text.size()));
+    return parts;
+}
+
 void ChangesContent::update(const Travel& travel) {
     const Moment moment = travel.moment();
     const auto marked = travel.marked();

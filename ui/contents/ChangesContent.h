@@ -2,13 +2,23 @@
 
 #include "travel/Travel.h"
 
+#include <cstddef>
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
 namespace pallax {
+
+/// The parts of a line, for a front end whose characters differ in width.
+struct ChangeParts {
+    std::size_t depth = 0; ///< how many blanks are before it: 0 for a section
+    std::string name;      ///< "Measured RSRP"
+    std::string change;    ///< "-77.75 dBm → -81.00 dBm (-3.25 dB)"; may be empty
+};
+ChangeParts changeParts(std::string_view line);
 
 /// What differs between the marked instant and the one that is shown.
 class ChangesContent {

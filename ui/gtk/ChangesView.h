@@ -22,7 +22,8 @@ public:
 
 private:
     void build();
-    void addLabel(const std::string& text, const char* look);
+    void addHeading(const std::string& text, const char* look);
+    void addLine(GtkGrid* to, int row, const std::string& line);
 
     Ref<GtkScrolledWindow> _scroller;
     GtkBox* _box; ///< the scroller owns it

@@ -50,6 +50,20 @@ TEST_F(ChangesContentTest, AreFromTheMarkToWhatIsShown) {
     EXPECT_TRUE(content.lines().empty());
 }
 
+TEST(ChangeParts, AreTheNameAndWhatHasChanged) {
+    const auto text = [](std::string_view line) {
+        const ChangeParts parts = changeParts(line);
+        return std::to_string(parts.depth) + "|" + parts.name + "|" + parts.change;
+    };
+    EXPECT_EQ(text("Serving Cell Measurements"), "0|Serving Cell Measurements|");
+    EXPECT_EQ(text("  Srxlev         44 dBm → 41 dBm (-3 dB)"), "2|Srxlev|44 dBm → 41 dBm (-3 dB)");
+    EXPECT_EQ(text("  Physical Cell ID 286  new"), "2|Physical Cell ID 286|new");
+    EXPECT_EQ(text("    Frequency Offset  20"), "4|Frequency Offset|20");
+    EXPECT_EQ(text("  name  "), "2|name|");
+    EXPECT_EQ(text("   "), "3||");
+    EXPECT_EQ(text(""), "0||");
+}
+
 TEST_F(ChangesContentTest, TheSpeedIsToldAsWhatItWillDo) {
     shown = timeline.get();
     travel.faster();

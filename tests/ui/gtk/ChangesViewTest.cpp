@@ -30,10 +30,12 @@ button: Back (focus)
 title: Changes / 
 text: Changes from 22:14:20 to 22:14:50
 text: Measurements
-text:   RSRP  -77 dBm → -81 dBm
-  RSRQ  -5 dB → -6 dB
+text: RSRP
+text: -77 dBm → -81 dBm
+text: RSRQ
+text: -5 dB → -6 dB
 text: Neighbours
-text:   1 is new
+text: 1 is new
 )");
     tested.view.show("Changes from 22:14:20 to 22:14:20", {});
     EXPECT_EQ(tested.dump(), R"(
