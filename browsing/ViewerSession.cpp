@@ -4,6 +4,7 @@
 #include "host/Snapshot.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
+#include "platform/RecordedTechnology.h"
 #include "text/Format.h"
 #include "timeline/Timeline.h"
 
@@ -59,6 +60,17 @@ void ViewerSession::setSafe(bool isSafe) {
     _timeline.restart(isSafe);
     mask(isSafe);
     _session->startAfresh();
+}
+
+void ViewerSession::recordWith(
+    std::function<void(const RecordedTechnology&, Time stamp, Bytes packet)> recorder) {
+    _link.setTap(recorder
+                     ? LinkPorts::PacketTap([this, recorder = std::move(recorder)](Bytes packet) {
+                           if (_technology != nullptr) {
+                               recorder(*_technology, _link.clock().stamp(), packet);
+                           }
+                       })
+                     : nullptr);
 }
 
 /// Applies to the packets that follow.
@@ -128,6 +140,7 @@ EntryPart ViewerSession::entryPart(const std::string& path) const {
 void ViewerSession::begin(const std::string& technology) {
     _alarms.begin(nullptr); // the values end
     _isSnapshot = technology == kSnapshotTechnology.identifier;
+    _technology = technologyOfIdentifier(technology);
     _safe.begin(technology);
     _watch.begin(technology);
     _timeline.begin(technology);

@@ -9,6 +9,7 @@
 #include "ui/gtk/ValueView.h"
 #include "ui/gtk/WidgetToolkit.h"
 #include "ui/pages/ShownValues.h"
+#include "window/Recordings.h"
 
 #include <functional>
 #include <memory>
@@ -38,6 +39,8 @@ public:
     WindowSession& operator=(const WindowSession&) = delete;
 
     void start() { _viewer.start(); }
+    /// See ViewerSession.
+    void recordWith(Recordings::Sink sink) { _viewer.recordWith(std::move(sink)); }
     bool hasLostSource() const { return _viewer.hasLostSource(); }
 
     gtk::OverviewView& overview() { return _overview; }

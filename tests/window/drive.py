@@ -8,6 +8,8 @@
   focus NAME       goes to it
   key KEY          presses a key: Escape, Right
   type NAME=TEXT   puts the text into the field with this name
+  menu NAME        opens the menu and chooses the entry with this name
+  windows COUNT    waits until so many windows are open
   tree             prints all names
 
 A NAME that ends in * is the beginning of one. Prints what failed and ends with status 1.
@@ -136,6 +138,12 @@ def step(verb, argument):
         row = await_result(lambda: find(argument), "no row " + argument)
         walk_to(row)
         press_key("Return")
+    elif verb == "menu":
+        step("press", "Menu")
+        entry = await_result(lambda: find(argument, Atspi.Role.MENU_ITEM), "no entry " + argument)
+        entry.get_action_iface().do_action(0)
+    elif verb == "windows":
+        await_result(lambda: len(list(windows())) == int(argument), "not so many windows: " + argument)
     elif verb == "focus":
         walk_to(await_result(lambda: find(argument), "no row " + argument))
     elif verb == "key":

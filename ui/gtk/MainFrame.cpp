@@ -289,7 +289,10 @@ void MainFrame::closePage() {
     }
 }
 
-void MainFrame::present() {
+void MainFrame::present(const std::string& token) {
+    if (!token.empty()) {
+        gtk_window_set_startup_id(window(), token.c_str());
+    }
     gtk_window_present(window());
 }
 
