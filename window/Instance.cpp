@@ -85,7 +85,16 @@ void refuse(GDBusMethodInvocation* invocation, const char* why) {
 } // namespace
 
 gtk::Ref<GDBusConnection> sessionBus() {
-    return gtk::Ref<GDBusConnection>(g_bus_get_sync(G_BUS_TYPE_SESSION, nullptr, nullptr));
+    gchar* address = g_dbus_address_get_for_bus_sync(G_BUS_TYPE_SESSION, nullptr, nullptr);
+    constexpr auto kClient =
+        static_cast<GDBusConnectionFlags>(G_DBUS_CONNECTION_FLAGS_AUTHENTICATION_CLIENT |
+                                          G_DBUS_CONNECTION_FLAGS_MESSAGE_BUS_CONNECTION);
+    gtk::Ref<GDBusConnection> bus(
+        address == nullptr ? nullptr
+                           : g_dbus_connection_new_for_address_sync(address, kClient, nullptr,
+                                                                    nullptr, nullptr));
+    g_free(address);
+    return bus;
 }
 
 std::string activationToken() {

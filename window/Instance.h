@@ -16,7 +16,8 @@ inline constexpr const char* kApplicationId = "example.pallax.Pallax";
 /// the front.
 inline constexpr const char* kShowAction = "show";
 
-/// The session's bus; null if there is none.
+/// A connection to the session's bus, beside that of the toolkit, which has objects of its own at
+/// the application's path; null if there is no bus.
 gtk::Ref<GDBusConnection> sessionBus();
 
 /// What the desktop sent along so that the window of this start may come to the front; "" if it is

@@ -9,6 +9,7 @@
   key KEY          presses a key: Escape, Right
   type NAME=TEXT   puts the text into the field with this name
   menu NAME        opens the menu and chooses the entry with this name
+  entry NAME       chooses the entry in the menu that is open
   windows COUNT    waits until so many windows are open
   tree             prints all names
 
@@ -35,8 +36,11 @@ def children(node):
 
 def windows():
     for application in children(Atspi.get_desktop(0)):
-        if application is not None and "pallax" in (application.get_name() or "").lower():
-            yield from children(application)
+        try:
+            if application is not None and "pallax" in (application.get_name() or "").lower():
+                yield from children(application)
+        except Exception:  # it is gone
+            continue
 
 
 def walk(node):
@@ -52,6 +56,12 @@ def is_shown(node):
     return states.contains(Atspi.StateType.VISIBLE)
 
 
+def is_drawn(node):
+    """Of a dialog's buttons, which it has twice, one above the other and side by side."""
+    node.clear_cache()
+    return node.get_component_iface().get_size().x > 0
+
+
 def find(name, role=None):
     """The last one: pages that are covered by others come before them."""
     found = None
@@ -61,6 +71,8 @@ def find(name, role=None):
                 own = node.get_name() or ""
                 matches = own.startswith(name[:-1]) if name.endswith("*") else own == name
                 if matches and (role is None or node.get_role() == role) and is_shown(node):
+                    if role == Atspi.Role.PUSH_BUTTON and not is_drawn(node):
+                        continue
                     found = node
             except Exception:  # it is gone
                 continue
@@ -140,6 +152,8 @@ def step(verb, argument):
         press_key("Return")
     elif verb == "menu":
         step("press", "Menu")
+        step("entry", argument)
+    elif verb == "entry":
         entry = await_result(lambda: find(argument, Atspi.Role.MENU_ITEM), "no entry " + argument)
         entry.get_action_iface().do_action(0)
     elif verb == "windows":

@@ -80,7 +80,12 @@ TEST_F(RecentFilesTest, ThoseThatAreGoneAreNotOffered) {
 
 TEST_F(RecentFilesTest, ThoseOfOtherApplicationsAreNotOfferedAndStay) {
     const std::string other = "file://" + file("letter.txt");
-    ASSERT_TRUE(gtk_recent_manager_add_item(manager.get(), other.c_str()));
+    std::string type = "text/plain";
+    std::string application = "Letters";
+    std::string program = "letters";
+    const GtkRecentData data{nullptr, nullptr, type.data(), application.data(), program.data(),
+                             nullptr, FALSE};
+    ASSERT_TRUE(gtk_recent_manager_add_full(manager.get(), other.c_str(), &data));
     files->add(file("drive.pcap"));
     await(1);
     ASSERT_TRUE(gtk_widget_activate_action(stage->window(), "recent.clear", nullptr));
