@@ -67,7 +67,8 @@ public:
         _frame.addBar(_session->timeBar().widget());
         _frame.onKey([this](guint key, GdkModifierType state) { return handleKey(key, state); });
         _session->start();
-        if (isFile() && !request.options.safe) {
+        std::error_code unknown;
+        if (std::filesystem::is_regular_file(_recording, unknown) && !request.options.safe) {
             _recent.add(_recording);
         }
         serve();

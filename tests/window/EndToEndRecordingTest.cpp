@@ -71,6 +71,15 @@ TEST_F(EndToEndRecording, AFullDiskIsAnAlert) {
     EXPECT_GT(packetsIn(target()), 0U);
 }
 
+TEST_F(EndToEndRecording, ARecordingThatIsNotWholeAtTheEndIsAFailure) {
+    const CommandRun run =
+        runOnBus(PALLAX_PROGRAM " demo lte & p=$!\n" +
+                 driving("has 'SIM Info' " + recordInto(target()) + "has made.pcapng") + "rm " +
+                 target() + "; kill -TERM $p; wait $p; exit $?\n");
+    expectDriven(run, 1);
+    EXPECT_NE(run.out.find("pallax: The recording " + target()), std::string::npos) << run.out;
+}
+
 TEST_F(EndToEndRecording, OnlyARecordingKeepsTheMachineAwake) {
     expectDriven(driveWithSessionManager("demo lte", "has 'SIM Info' " + recordInto(target()) +
                                                          "has made.pcapng press Stop lacks Stop"));

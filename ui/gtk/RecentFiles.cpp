@@ -119,6 +119,7 @@ std::vector<std::string> RecentFiles::paths() const {
                      [](const auto& a, const auto& b) { return a.first > b.first; });
     found.resize(std::min(found.size(), kMost));
     std::vector<std::string> paths;
+    paths.reserve(found.size());
     for (auto& [time, path] : found) {
         paths.push_back(std::move(path));
     }
