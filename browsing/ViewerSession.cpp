@@ -5,6 +5,7 @@
 #include "host/Snapshot.h"
 #include "host/UserFolders.h"
 #include "link/Settings.h"
+#include "platform/RecordedTechnology.h"
 #include "querying/QueryHistory.h"
 #include "text/Format.h"
 #include "timeline/Timeline.h"
@@ -61,6 +62,17 @@ void ViewerSession::setSafe(bool isSafe) {
     _timeline.restart(isSafe);
     mask(isSafe);
     _session->startAfresh();
+}
+
+void ViewerSession::recordWith(
+    std::function<void(const RecordedTechnology&, Time stamp, Bytes packet)> recorder) {
+    _link.setTap(recorder
+                     ? LinkPorts::PacketTap([this, recorder = std::move(recorder)](Bytes packet) {
+                           if (_technology != nullptr) {
+                               recorder(*_technology, _link.clock().stamp(), packet);
+                           }
+                       })
+                     : nullptr);
 }
 
 /// Applies to the packets that follow.
@@ -130,6 +142,7 @@ EntryPart ViewerSession::entryPart(const std::string& path) const {
 void ViewerSession::begin(const std::string& technology) {
     _alarms.begin(nullptr); // the values end
     _isSnapshot = technology == kSnapshotTechnology.identifier;
+    _technology = technologyOfIdentifier(technology);
     _safe.begin(technology);
     _watch.begin(technology);
     _timeline.begin(technology);

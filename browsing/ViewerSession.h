@@ -27,6 +27,7 @@
 
 namespace pallax {
 
+struct RecordedTechnology;
 struct Settings;
 
 /// One modem or recording under any front end: its link, its model, its timeline and its alarms.
@@ -87,6 +88,10 @@ public:
     /// Shows nothing that identifies a person, or everything again: starts afresh with packets that
     /// are masked as they arrive, or not, so that nothing of the time before is left.
     void setSafe(bool isSafe);
+    /// Gives each packet, with the stamp of its source, to a recorder before it is decoded: as it
+    /// is shown, so masked while nothing identifies a person. An empty function ends that.
+    void
+    recordWith(std::function<void(const RecordedTechnology&, Time stamp, Bytes packet)> recorder);
     /// Says why the past is not whole, each time it is looked at.
     void tellTrouble();
 
@@ -125,6 +130,8 @@ private:
     StatusWatch _watch;
     SnapshotOverview _snapshot;
     bool _isSnapshot = false; ///< the packets are the displays of a snapshot
+    const RecordedTechnology* _technology =
+        nullptr; ///< of the packets; null: none that is recorded
     ViewedTimeline _timeline;
     Travel _travel;
     std::optional<std::string> _toldTrouble; ///< of the timeline, since time is held

@@ -1,13 +1,14 @@
 #include "cli/Completion.h"
+#include "text/Format.h"
 
 namespace pallax {
 
 namespace {
 
 constexpr const char* kBegin =
-    R"(# Completion of pallax's command line, written by "pallax completion bash".
+    R"(# Completion of %@'s command line, written by "%@ completion bash".
 
-_pallax() {
+%@() {
     local current=${COMP_WORDS[COMP_CWORD]} option= command= words= files= found
     ((COMP_CWORD > 0)) && option=${COMP_WORDS[COMP_CWORD - 1]}
     if [[ $current == = ]]; then # "--color=" comes as two words, "--color=never" as three
@@ -28,7 +29,7 @@ constexpr const char* kEnd = R"(    COMPREPLY=()
     fi
 }
 
-complete -F _pallax pallax
+complete -F %@ %@
 )";
 
 std::string joined(const std::vector<std::string>& words) {
@@ -89,14 +90,15 @@ std::string bashCompletion(const CommandDescription& program) {
         patterns.append(patterns.empty() ? "" : " | ").append(command.name);
         cases.append(casesOf(command, command.name));
     }
-    std::string script = kBegin;
+    const std::string function = completionFunction(program);
+    std::string script = formatText(kBegin, {program.name, program.name, function});
     script.append("    if ((COMP_CWORD > 1)); then\n        case ${COMP_WORDS[1]} in\n");
     script.append("            " + patterns + ") command=${COMP_WORDS[1]} ;;\n");
     script.append("        esac\n    fi\n    case \"$command $option\" in\n");
     script.append(cases).append(casesOf(program, ""));
     script.append("    esac\n    if ((COMP_CWORD == 1)) && [[ $current != -* ]]; then\n");
     script.append("        words='" + joined(names) + "'\n    fi\n");
-    return script.append(kEnd);
+    return script.append(formatText(kEnd, {function, program.name}));
 }
 
 } // namespace pallax

@@ -27,6 +27,12 @@ std::vector<std::string> completionShells() {
     return shells;
 }
 
+std::string completionFunction(const CommandDescription& program) {
+    std::string name = "_" + program.name;
+    std::replace(name.begin(), name.end(), '-', '_');
+    return name;
+}
+
 std::string completionScript(const CommandDescription& program, std::string_view shell) {
     const auto* found = std::find_if(kScripts.begin(), kScripts.end(),
                                      [shell](const auto& each) { return each.first == shell; });

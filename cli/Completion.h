@@ -15,6 +15,9 @@ std::vector<std::string> completionShells();
 /// choices, and files. Empty for an unknown shell.
 std::string completionScript(const CommandDescription& program, std::string_view shell);
 
+/// The name of the shell function that completes the program's command line.
+std::string completionFunction(const CommandDescription& program);
+
 std::string bashCompletion(const CommandDescription& program);
 std::string zshCompletion(const CommandDescription& program);
 std::string fishCompletion(const CommandDescription& program);

@@ -26,8 +26,9 @@ std::string choicesOf(const OptionDescription& option) {
 }
 
 /// The lines for one command's options and arguments, which apply under `condition`.
-std::string linesOf(const CommandDescription& command, const std::string& condition) {
-    const std::string begin = "complete -c pallax -n " + shellQuoted(condition);
+std::string linesOf(const CommandDescription& command, const std::string& program,
+                    const std::string& condition) {
+    const std::string begin = "complete -c " + program + " -n " + shellQuoted(condition);
     std::string lines;
     for (const OptionDescription& option : command.options) {
         lines.append(begin);
@@ -50,17 +51,20 @@ std::string linesOf(const CommandDescription& command, const std::string& condit
 } // namespace
 
 std::string fishCompletion(const CommandDescription& program) {
-    std::string script = "# Completion of pallax's command line, written by \"pallax completion "
-                         "fish\".\n\ncomplete -c pallax -f\n";
+    const std::string complete = "complete -c " + program.name;
+    std::string script = "# Completion of " + program.name + "'s command line, written by \"" +
+                         program.name + " completion fish\".\n\n" + complete + " -f\n";
     std::string names;
     std::string lines;
     for (const CommandDescription& command : program.commands) {
         names.append(" ").append(command.name);
-        script.append("complete -c pallax -n '__fish_is_nth_token 1' -a " + command.name + " -d " +
+        script.append(complete + " -n '__fish_is_nth_token 1' -a " + command.name + " -d " +
                       shellQuoted(command.description) + "\n");
-        lines.append("\n").append(linesOf(command, "__fish_seen_subcommand_from " + command.name));
+        lines.append("\n").append(
+            linesOf(command, program.name, "__fish_seen_subcommand_from " + command.name));
     }
-    script.append("\n").append(linesOf(program, "not __fish_seen_subcommand_from" + names));
+    script.append("\n").append(
+        linesOf(program, program.name, "not __fish_seen_subcommand_from" + names));
     return script.append(lines);
 }
 

@@ -63,19 +63,20 @@ std::string linesOf(const CommandDescription& command) {
     return lines;
 }
 
-std::string functionOf(const CommandDescription& command) {
+std::string functionOf(const CommandDescription& command, const std::string& prefix) {
     std::string arguments;
     for (const OptionDescription& argument : command.arguments) {
         arguments.append(
             line(formatText("%@%@", {argument.repeats ? "*" : "", valueOf(argument)})));
     }
-    return formatText("_pallax_%@() {\n    _arguments -s%@%@\n}\n\n",
-                      {command.name, linesOf(command), arguments});
+    return formatText("%@_%@() {\n    _arguments -s%@%@\n}\n\n",
+                      {prefix, command.name, linesOf(command), arguments});
 }
 
 } // namespace
 
 std::string zshCompletion(const CommandDescription& program) {
+    const std::string function = completionFunction(program);
     std::string commands;
     std::string patterns;
     std::string functions;
@@ -83,23 +84,27 @@ std::string zshCompletion(const CommandDescription& program) {
         commands.append("        '" + command.name + ":" + escaped(command.description, ":\\") +
                         "'\n");
         patterns.append(patterns.empty() ? "" : "|").append(command.name);
-        functions.append(functionOf(command));
+        functions.append(functionOf(command, function));
     }
-    std::string script = "#compdef pallax\n# Completion of pallax's command line, written by "
-                         "\"pallax completion zsh\".\n\n";
+    std::string script = formatText("#compdef %@\n# Completion of %@'s command line, written by "
+                                    "\"%@ completion zsh\".\n\n",
+                                    {program.name, program.name, program.name});
     script.append(functions);
-    script.append("_pallax_commands_or_files() {\n    local -a commands\n    commands=(\n");
+    script.append(function + "_commands_or_files() {\n    local -a commands\n    commands=(\n");
     script.append(commands);
     script.append("    )\n    if (( CURRENT == 2 )); then\n");
     script.append("        _describe -t commands command commands\n    fi\n    _files\n}\n\n");
-    script.append("_pallax() {\n    if (( CURRENT > 2 )) && [[ $words[2] == (" + patterns +
+    script.append(function + "() {\n    if (( CURRENT > 2 )) && [[ $words[2] == (" + patterns +
                   ") ]]; then\n");
     script.append("        local command=$words[2]\n        shift words\n        (( CURRENT-- ))\n"
-                  "        _pallax_$command\n        return\n    fi\n    _arguments -s");
+                  "        " +
+                  function + "_$command\n        return\n    fi\n    _arguments -s");
     script.append(linesOf(program));
-    script.append(line(":command or recording:_pallax_commands_or_files"));
-    script.append("\n}\n\nif [[ $funcstack[1] == _pallax ]]; then\n    _pallax \"$@\"\n"
-                  "else\n    compdef _pallax pallax\nfi\n");
+    script.append(line(":command or recording:" + function + "_commands_or_files"));
+    // A file in the shell's folder of functions is named after the program.
+    script.append(formatText("\n}\n\nif [[ $funcstack[1] == _%@ ]]; then\n    %@ \"$@\"\n"
+                             "else\n    compdef %@ %@\nfi\n",
+                             {program.name, function, function, program.name}));
     return script;
 }
 

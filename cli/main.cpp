@@ -1,22 +1,17 @@
 #include "browsing/Browse.h"
 #include "cli/Options.h"
-#include "console/Output.h"
+#include "cli/Program.h"
 #include "decoding/Decode.h"
-#include "decoding/FatalRecord.h"
 #include "decoding/InfoCommand.h"
 #include "decoding/SnapshotCommand.h"
-#include "host/Complaint.h"
-#include "host/StandardDescriptors.h"
 #include "inspecting/ModemCommand.h"
 #include "live/LiveEvents.h"
 #include "recording/Record.h"
-#include "telephony/ChildService.h"
 #include "web/WebCommand.h"
 
-#include <csignal>
-#include <exception>
 #include <string>
-#include <unistd.h>
+#include <utility>
+#include <variant>
 #include <vector>
 
 namespace {
@@ -60,41 +55,13 @@ struct Run {
     ExitStatus operator()(const ModemPolicyOptions& options) const {
         return runModemPolicy(options);
     }
-    ExitStatus operator()(const ParseEnd& end) const {
-        if (end.status == kExitSuccess) {
-            writeToDescriptor(STDOUT_FILENO, "Standard output")(end.text);
-        } else {
-            passOnComplaints(end.text);
-        }
-        return end.status;
-    }
+    ExitStatus operator()(const ParseEnd& end) const { return tell(end); }
 };
-
-ExitStatus run(std::vector<std::string> arguments) {
-    try {
-        return std::visit(Run(), parseOptions(std::move(arguments)));
-    } catch (const OutputClosed&) {
-        return kExitSuccess; // the reader has seen enough
-    } catch (const FatalRecord& fatal) {
-        complain(fatal.what());
-        return kExitFatalRecord;
-    } catch (const std::exception& error) {
-        complain(error.what());
-        return kExitFailure;
-    }
-}
 
 } // namespace
 
 int main(int argc, char** argv) {
-    if (!openStandardDescriptors()) {
-        return kExitFailure; // standard error cannot be used
-    }
-    if (argc > 1 && argv[1] == kChildServiceCommand) {
-        return runChildService(argc, argv);
-    }
-    // Write reports a closed pipe, or a file that may not grow, as an error.
-    (void)std::signal(SIGPIPE, SIG_IGN);
-    (void)std::signal(SIGXFSZ, SIG_IGN);
-    return run({argv + (argc > 0 ? 1 : 0), argv + argc});
+    return runProgram(argc, argv, [](std::vector<std::string> arguments) {
+        return std::visit(Run(), parseOptions(std::move(arguments)));
+    });
 }

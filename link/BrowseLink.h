@@ -46,6 +46,8 @@ public:
     /// See LinkPorts.
     void setFilter(LinkPorts::PacketFilter filter) { _linkPorts.setFilter(std::move(filter)); }
     /// See LinkPorts.
+    void setTap(LinkPorts::PacketTap tap) { _linkPorts.setTap(std::move(tap)); }
+    /// See LinkPorts.
     const std::string& obstacle() const { return _linkPorts.obstacle(); }
 
     /// See LinkPorts.

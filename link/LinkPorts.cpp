@@ -74,11 +74,15 @@ MessagePorts::Local LinkPorts::createLocal(std::string_view name, ReceiveCallbac
     ReceiveCallback receive = [this, callback = std::move(callback)](std::int32_t identifier,
                                                                      Bytes data) {
         ++_received;
-        if (_filter && identifier == kPacketMessage) {
-            const ByteBuffer filtered = _filter(data);
-            return callback(identifier, filtered);
+        if (identifier != kPacketMessage) {
+            return callback(identifier, data);
         }
-        return callback(identifier, data);
+        const ByteBuffer filtered = _filter ? _filter(data) : ByteBuffer();
+        const Bytes delivered = _filter ? Bytes(filtered) : data;
+        if (_tap) {
+            _tap(delivered);
+        }
+        return callback(identifier, delivered);
     };
     _localName = name;
     Local local = _setup.ports.createLocal(_localName, receive);

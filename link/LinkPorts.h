@@ -30,6 +30,8 @@ public:
 
     /// What is delivered in place of a packet.
     using PacketFilter = std::function<ByteBuffer(Bytes packet)>;
+    /// Sees each packet as it is delivered, just before.
+    using PacketTap = std::function<void(Bytes packet)>;
 
     /// The references in the setup must outlive the ports.
     explicit LinkPorts(Setup setup);
@@ -40,6 +42,7 @@ public:
 
     /// Applies to all packets that follow.
     void setFilter(PacketFilter filter) { _filter = std::move(filter); }
+    void setTap(PacketTap tap) { _tap = std::move(tap); }
 
     /// The last problem of the latest start ("No telephony service is running"), for a link that is
     /// not connected; empty before the first start.
@@ -55,6 +58,7 @@ private:
     Setup _setup;
     std::string _noService; ///< an obstacle
     PacketFilter _filter;   // may be empty
+    PacketTap _tap;         // likewise
     std::string _localName; ///< in place of the model's
     std::string _obstacle;
     std::uint64_t _received = 0;

@@ -11,7 +11,6 @@
 #include "recording/RecordOptions.h"
 #include "recording/Recorder.h"
 #include "telephony/ChildService.h"
-#include "text/Format.h"
 
 #include <algorithm>
 #include <csignal>
@@ -68,8 +67,7 @@ ExitStatus record(const RecordOptions& options) {
         failure = Recorder::failureText(*error, **files);
     }
     if ((*files)->tooLarge() > 0) {
-        complain(formatText("%llu packets of more than %zu bytes were omitted.",
-                            {(*files)->tooLarge(), PcapNgWriter::kLargestPacket}));
+        complain(Recorder::omissionText(**files));
     }
     if (failure) {
         complain(*failure);

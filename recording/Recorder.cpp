@@ -47,6 +47,11 @@ std::string Recorder::failureText(const HostError& error, const RecordingFiles& 
     return formatText("%@ %llu packets are recorded.", {error.sentence, files.packets()});
 }
 
+std::string Recorder::omissionText(const RecordingFiles& files) {
+    return formatText("%llu packets of more than %zu bytes were omitted.",
+                      {files.tooLarge(), PcapNgWriter::kLargestPacket});
+}
+
 std::string Recorder::progressText(const RecordingFiles& files, std::uint64_t packetsPerSecond,
                                    bool isConnected) {
     const std::string sum =

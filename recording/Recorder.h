@@ -28,6 +28,8 @@ public:
 
     /// The error's sentence, and how many packets were recorded nevertheless.
     static std::string failureText(const HostError& error, const RecordingFiles& files);
+    /// How many packets were too large to be recorded.
+    static std::string omissionText(const RecordingFiles& files);
     /// "120 packets, 4800 bytes, 50 packets/s", or that there is no modem yet.
     static std::string progressText(const RecordingFiles& files, std::uint64_t packetsPerSecond,
                                     bool isConnected);

@@ -1,6 +1,11 @@
 #include "window/Arguments.h"
 
+#include "cli/CommandLine.h"
+#include "cli/Completion.h"
+
 #include <algorithm>
+#include <array>
+#include <filesystem>
 #include <string_view>
 #include <utility>
 
@@ -41,6 +46,31 @@ bool asksForHelp(const std::vector<std::string>& arguments) {
     });
 }
 
+/// The options that only a terminal has.
+constexpr auto kTerminalOptions =
+    std::to_array<std::string_view>({"--print", "--plain", "--color", "--no-mouse"});
+
+bool isTerminals(const OptionDescription& option) {
+    return std::any_of(option.names.begin(), option.names.end(), [](const std::string& name) {
+        return std::find(kTerminalOptions.begin(), kTerminalOptions.end(), name) !=
+               kTerminalOptions.end();
+    });
+}
+
+/// The part of pallax's command line that a window has.
+CommandDescription description() {
+    CommandDescription window = CommandLine().description();
+    window.name = "pallax-window";
+    std::erase_if(window.commands, [](const CommandDescription& command) {
+        return command.name != "demo" && command.name != "modem";
+    });
+    std::erase_if(window.options, isTerminals);
+    for (CommandDescription& command : window.commands) {
+        std::erase_if(command.options, isTerminals);
+    }
+    return window;
+}
+
 /// Why a window cannot do it; empty if it can.
 std::string refusalOf(const BrowseOptions& options) {
     const BrowseOptions usual;
@@ -56,15 +86,56 @@ std::string refusalOf(const BrowseOptions& options) {
     return "";
 }
 
+std::string canonical(const std::string& path) {
+    std::error_code unknown;
+    const auto found = std::filesystem::weakly_canonical(std::filesystem::absolute(path), unknown);
+    return unknown ? path : found.string();
+}
+
+/// The source with paths that mean the same in every folder; nothing for standard input.
+std::optional<Source> anywhere(Source source) {
+    if (recordingPath(source) == "-") {
+        return std::nullopt;
+    }
+    if (auto* file = std::get_if<FileRecording>(&source)) {
+        file->path = canonical(file->path);
+        std::transform(file->further.begin(), file->further.end(), file->further.begin(),
+                       canonical);
+    } else if (auto* stream = std::get_if<StreamedRecording>(&source)) {
+        stream->path = canonical(stream->path);
+    }
+    return source;
+}
+
 } // namespace
+
+std::optional<std::string> keyOf(const BrowseOptions& options) {
+    const auto source = anywhere(options.source);
+    if (!source || options.logLevel) {
+        return std::nullopt;
+    }
+    const PlayOptions& play = options.play;
+    std::string key = std::to_string(play.speed) + (play.loop ? " loop" : "") +
+                      (options.safe ? " safe " : " ") + options.profile.value_or("") +
+                      (options.keepGoing ? " on" : "");
+    for (const std::string& word : argumentsOf(*source)) {
+        key += '\n' + word;
+    }
+    return key;
+}
 
 std::variant<BrowseOptions, ParseEnd> windowOptions(std::vector<std::string> arguments) {
     if (asksForHelp(arguments)) {
         return ParseEnd{kExitSuccess, std::string(kHelp)};
     }
     const std::string first = arguments.empty() ? "" : arguments.front();
+    const std::string last = arguments.empty() ? "" : arguments.back();
     ParsedOptions parsed = parseOptions(std::move(arguments));
-    if (auto* end = std::get_if<ParseEnd>(&parsed)) {
+    auto* end = std::get_if<ParseEnd>(&parsed);
+    if (end != nullptr && end->status == kExitSuccess && first == "completion") {
+        return ParseEnd{kExitSuccess, completionScript(description(), last)};
+    }
+    if (end != nullptr && first != "manual") {
         return std::move(*end);
     }
     auto* options = std::get_if<BrowseOptions>(&parsed);

@@ -1,5 +1,8 @@
 #include "window/Programs.h"
 
+#include "console/ExitStatus.h"
+#include "ui/gtk/Ref.h"
+
 #include <filesystem>
 #include <gio/gio.h>
 #include <memory>
@@ -19,7 +22,10 @@ void finished(GObject* process, GAsyncResult* result, gpointer data) {
     gchar* text = nullptr;
     (void)g_subprocess_communicate_utf8_finish(G_SUBPROCESS(process), result, nullptr, &text,
                                                nullptr);
-    const bool isDone = g_subprocess_get_successful(G_SUBPROCESS(process)) != FALSE;
+    auto* ended = G_SUBPROCESS(process);
+    const bool isDone = g_subprocess_get_successful(ended) != FALSE ||
+                        (g_subprocess_get_if_exited(ended) != FALSE &&
+                         g_subprocess_get_exit_status(ended) == kExitFatalRecord);
     std::string complaint = isDone ? "" : text != nullptr ? text : "The program was ended.";
     g_free(text);
     waiting->queue.async(
@@ -29,16 +35,23 @@ void finished(GObject* process, GAsyncResult* result, gpointer data) {
 } // namespace
 
 void runBeside(MainQueue& queue, const std::vector<std::string>& words,
-               const std::function<void(const std::string& complaint)>& ended) {
+               const std::function<void(const std::string& complaint)>& ended,
+               const std::string& token) {
     std::vector<const char*> arguments;
     arguments.reserve(words.size() + 1);
     for (const std::string& word : words) {
         arguments.push_back(word.c_str());
     }
     arguments.push_back(nullptr);
+    const gtk::Ref<GSubprocessLauncher> launcher(
+        g_subprocess_launcher_new(G_SUBPROCESS_FLAGS_STDERR_PIPE));
+    for (const char* name : {"DESKTOP_STARTUP_ID", "XDG_ACTIVATION_TOKEN"}) {
+        if (!token.empty()) {
+            g_subprocess_launcher_setenv(launcher.get(), name, token.c_str(), TRUE);
+        }
+    }
     GError* error = nullptr;
-    GSubprocess* process =
-        g_subprocess_newv(arguments.data(), G_SUBPROCESS_FLAGS_STDERR_PIPE, &error);
+    GSubprocess* process = g_subprocess_launcher_spawnv(launcher.get(), arguments.data(), &error);
     if (process == nullptr) {
         queue.async([ended, complaint = std::string(error->message)] { ended(complaint); });
         g_error_free(error);

@@ -6,10 +6,15 @@
 #include "host/Complaint.h"
 #include "host/Interruption.h"
 #include "ui/gtk/Menu.h"
+#include "ui/gtk/RecentFiles.h"
 #include "ui/gtk/ShownText.h"
 #include "ui/gtk/Translation.h"
+#include "window/Arguments.h"
 #include "window/GlibTurns.h"
+#include "window/Instance.h"
 #include "window/Programs.h"
+#include "window/Recordings.h"
+#include "window/StartToolkit.h"
 #include "window/WindowSession.h"
 
 #include <adwaita.h>
@@ -24,18 +29,28 @@ namespace pallax {
 
 namespace {
 
-/// Also the name of the desktop entry, the icon and the address on the session's bus.
-constexpr const char* kApplicationId = "example.pallax.Pallax";
-
 /// A window, and what its menu does.
 class WindowProgram {
 public:
-    explicit WindowProgram(GtkApplication* application)
-        : _application(application), _turns(_queue), _guard(_queue),
-          _frame(application, _guard, {.closed = [this] { _queue.stop(); }}) {
+    WindowProgram(GtkApplication* application, Instance& instance)
+        : _application(application), _instance(instance), _turns(_queue), _guard(_queue),
+          _frame(application, _guard, {.closed = [this] { close(); }}),
+          _recordings({.queue = _queue,
+                       .frame = _frame,
+                       .guard = _guard,
+                       .application = application,
+                       .source =
+                           [this](auto recorder) {
+                               if (_session) {
+                                   _session->recordWith(std::move(recorder));
+                               }
+                           }}),
+          _recent(_frame.window(), _guard, gtk_recent_manager_get_default(),
+                  [this](const auto& path) { open({path}, newToken()); }) {
         _queue.onSignal({SIGINT, SIGTERM, SIGHUP, SIGQUIT},
                         [this](int /*signal*/) { _queue.stop(); });
         acceptDrops();
+        acceptShow();
     }
 
     /// False if the child ended too early.
@@ -45,23 +60,36 @@ public:
         _session.emplace(WindowSession::Setup{_queue, _frame, _guard, notices, request,
                                               std::move(directory), child,
                                               [this](const auto& name) { notify(name); }});
-        _frame.setMenu(gtk::menuButton(_frame.window(), _guard, menu()));
+        GtkWidget* const button = gtk::menuButton(_frame.window(), _guard, menu());
+        g_menu_append_section(G_MENU(gtk_menu_button_get_menu_model(GTK_MENU_BUTTON(button))),
+                              nullptr, _recent.section());
+        _frame.setMenu(button);
         _frame.addBar(_session->timeBar().widget());
         _frame.onKey([this](guint key, GdkModifierType state) { return handleKey(key, state); });
         _session->start();
+        std::error_code unknown;
+        if (std::filesystem::is_regular_file(_recording, unknown) && !request.options.safe) {
+            _recent.add(_recording);
+        }
+        serve();
         try {
             _turns.run();
         } catch (const FatalRecord& fatal) {
             complain(fatal.what());
+            endRecording();
             _session.reset();
+            _instance.giveUpClaim();
             _frame.showEnded(fatal.what());
             _turns.run();
             throw;
         }
+        endRecording();
         const bool isWhole = !_session->hasLostSource();
         _session.reset();
         return isWhole;
     }
+    /// Whether all recordings that were made are whole.
+    bool isRecorded() const { return _isRecorded; }
 
 private:
     std::vector<std::vector<gtk::MenuEntry>> menu() {
@@ -80,15 +108,46 @@ private:
              {"changes", gtk::translated("Changes since the Mark"),
               onSession(&WindowSession::toggleChanges)}},
             _session->tablePages().menu(),
-            {{"safe", gtk::translated("Hide Identities"), onSession(&WindowSession::toggleSafe),
+            {{"safe", gtk::translated("Hide Identities"), [this] { toggleSafe(); },
               [this] { return _session && _session->isSafe(); }},
              {"afresh", gtk::translated("Start Afresh"), onSession(&WindowSession::startAfresh)}},
             {{"open", gtk::translated("Open Recording…"), [this] { chooseRecording(); }}}};
-        if (!_recording.empty() && _recording != "-") {
+        if (isFile()) {
             sections.back().push_back(
                 {"report", gtk::translated("Report in the Browser"), [this] { report(); }});
         }
+        if (_recording.empty()) {
+            sections.insert(sections.end() - 1,
+                            {{"record", gtk::translated("Record…"), [this] { record(); }}});
+        }
         return sections;
+    }
+
+    void close() {
+        _recordings.beforeClosing([this] { _queue.stop(); });
+    }
+
+    void record() {
+        if (_session) {
+            _recordings.choose();
+        }
+    }
+
+    /// Before the session ends. What is not whole is told on standard error, too.
+    void endRecording() {
+        if (const auto failure = _recordings.finish()) {
+            complain(*failure);
+            _isRecorded = false;
+        }
+    }
+
+    /// A recording holds either what identifies a person or not.
+    void toggleSafe() {
+        if (_recordings.isOn()) {
+            _frame.setMessage(gtk::translated("Stop the recording first."));
+        } else if (_session) {
+            _session->toggleSafe();
+        }
     }
 
     bool handleKey(guint key, GdkModifierType state) {
@@ -98,7 +157,7 @@ private:
         } else if ((isControl && key == GDK_KEY_f) || key == GDK_KEY_slash) {
             _frame.toggleSearch();
         } else if (isControl && (key == GDK_KEY_q || key == GDK_KEY_w)) {
-            _queue.stop();
+            close();
         } else if (!isControl && key == GDK_KEY_o) {
             _frame.toggleDetail();
         } else {
@@ -111,28 +170,65 @@ private:
     void notify(const std::string& name) {
         const gtk::Ref<GNotification> notice(g_notification_new(gtk::translated("Alarm")));
         g_notification_set_body(notice.get(), gtk::shownText(name).c_str());
+        g_notification_set_default_action_and_target(notice.get(),
+                                                     (std::string("app.") + kShowAction).c_str(),
+                                                     "s", _instance.windowName().c_str());
         g_application_send_notification(G_APPLICATION(_application), "alarm", notice.get());
     }
 
-    /// In a window, and process, of its own; what that cannot do is told here.
-    void open(const std::string& path) {
-        runBeside(_queue, {windowProgram(), path}, [this](const std::string& complaint) {
-            if (!complaint.empty()) {
-                _frame.showAlert(
-                    {gtk::translated("Cannot Open"), complaint, gtk::translated("Close")});
-            }
-        });
+    /// What others of the application ask this process for.
+    void serve() {
+        _instance.serve(
+            {.open = [this](const auto& words,
+                            const auto& token) { _guard.run([&] { open(words, token); }); },
+             .present = [this](const auto& token) { _guard.run([&] { _frame.present(token); }); }});
+    }
+
+    /// As a process of its own, which brings the window that shows the same to the front, if there
+    /// is one; what it cannot do is told here.
+    void open(std::vector<std::string> words, const std::string& token) {
+        words.insert(words.begin(), windowProgram());
+        runBeside(
+            _queue, words,
+            [this](const std::string& complaint) {
+                if (!complaint.empty()) {
+                    _frame.showAlert(
+                        {gtk::translated("Cannot Open"), complaint, gtk::translated("Close")});
+                }
+            },
+            token);
+    }
+
+    /// For a window that is opened from this one.
+    std::string newToken() {
+        const gtk::Ref<GAppLaunchContext> context(
+            G_APP_LAUNCH_CONTEXT(gdk_display_get_app_launch_context(
+                gtk_widget_get_display(GTK_WIDGET(_frame.window())))));
+        const gtk::Ref<GAppInfo> program(g_app_info_create_from_commandline(
+            "pallax-window", "Pallax", G_APP_INFO_CREATE_SUPPORTS_STARTUP_NOTIFICATION, nullptr));
+        gchar* made =
+            g_app_launch_context_get_startup_notify_id(context.get(), program.get(), nullptr);
+        std::string token = made != nullptr ? made : "";
+        g_free(made);
+        return token;
     }
 
     void openFile(GFile* file) {
         if (gchar* path = file != nullptr ? g_file_get_path(file) : nullptr) {
-            open(path);
-            gchar* address = g_file_get_uri(file);
-            (void)gtk_recent_manager_add_item(gtk_recent_manager_get_default(), address);
-            g_free(address);
+            open({path}, newToken());
             g_free(path);
         }
     }
+
+    /// A notice of this window was pressed, where the desktop calls the program itself.
+    void acceptShow() {
+        const gtk::Ref<GSimpleAction> show(g_simple_action_new(kShowAction, G_VARIANT_TYPE_STRING));
+        gtk::onSignal(show.get(), "activate", _guard, [this] { _frame.present(); });
+        g_action_map_add_action(G_ACTION_MAP(_application), G_ACTION(show.get()));
+    }
+
+    /// Whether a recording or snapshot in a file is shown.
+    bool isFile() const { return !_recording.empty() && _recording != "-"; }
 
     void chooseRecording() {
         _chooser = gtk::Ref<GtkFileChooserNative>(gtk_file_chooser_native_new(
@@ -180,44 +276,44 @@ private:
     }
 
     GtkApplication* _application;
+    Instance& _instance;
     AsioMainQueue _queue;
     GlibTurns _turns;
     gtk::Guard _guard;
     gtk::MainFrame _frame;
     std::string _recording; ///< its path; empty if what is shown is none
     std::optional<WindowSession> _session;
+    Recordings _recordings;
+    bool _isRecorded = true;
+    gtk::RecentFiles _recent;
     gtk::Ref<GtkFileChooserNative> _chooser; ///< the latest
 };
-
-/// Beside the program where it was built, or where it is installed.
-std::string translationsFolder() {
-    const std::filesystem::path folder = std::filesystem::path(windowProgram()).parent_path();
-    std::error_code missing;
-    return std::filesystem::exists(folder / "locale", missing)
-               ? (folder / "locale").string()
-               : (folder.parent_path() / "share/locale").string();
-}
 
 } // namespace
 
 ExitStatus runWindow(const BrowseOptions& options) {
     const Interruption interruption;
-    gtk_disable_setlocale(); // numbers are written and read in the same way everywhere
-    gtk::useTranslations(translationsFolder().c_str());
-    if (gtk_init_check() == FALSE) {
-        complain("There is no display for a window; pallax shows the same in a terminal.");
+    const gtk::Ref<GDBusConnection> bus = sessionBus();
+    Instance instance(bus.get());
+    const auto key = keyOf(options);
+    if (key && !instance.claim(*key, activationToken())) {
+        return kExitSuccess; // another process shows it
+    }
+    if (!startToolkit()) {
         return kExitFailure;
     }
-    g_set_prgname(kApplicationId); // what a compositor knows the window by
-    g_set_application_name("Pallax");
-    adw_init();
     const gtk::Ref<GtkApplication> application(
         GTK_APPLICATION(adw_application_new(kApplicationId, G_APPLICATION_NON_UNIQUE)));
     (void)g_application_register(G_APPLICATION(application.get()), nullptr, nullptr);
-    return showSource(options, [&application](const ShowRequest& request, SocketDirectory directory,
-                                              ChildService* child) {
-        return WindowProgram(application.get()).show(request, std::move(directory), child);
-    });
+    bool isRecorded = true;
+    const ExitStatus status = showSource(
+        options, [&](const ShowRequest& request, SocketDirectory directory, ChildService* child) {
+            WindowProgram program(application.get(), instance);
+            const bool isWhole = program.show(request, std::move(directory), child);
+            isRecorded = program.isRecorded();
+            return isWhole;
+        });
+    return isRecorded ? status : kExitFailure;
 }
 
 } // namespace pallax

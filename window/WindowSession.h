@@ -9,6 +9,7 @@
 #include "ui/gtk/WidgetToolkit.h"
 #include "window/ChangesPage.h"
 #include "window/LongWork.h"
+#include "window/Recordings.h"
 #include "window/TablePages.h"
 #include "window/ValuePages.h"
 
@@ -40,6 +41,8 @@ public:
     WindowSession& operator=(const WindowSession&) = delete;
 
     void start() { _viewer.start(); }
+    /// See ViewerSession.
+    void recordWith(Recordings::Sink sink) { _viewer.recordWith(std::move(sink)); }
     bool hasLostSource() const { return _viewer.hasLostSource(); }
 
     gtk::OverviewView& overview() { return _overview; }

@@ -87,6 +87,22 @@ TEST_F(LinkPortsTest, WhereTheFixedNameIsTakenTheNextViewerHasANameOfItsOwn) {
     EXPECT_EQ(_link.received(), 1U);
 }
 
+TEST_F(LinkPortsTest, ATapSeesPacketsAsTheyAreDelivered) {
+    std::vector<ByteBuffer> seen;
+    _link.setTap([&](Bytes packet) { seen.emplace_back(packet.begin(), packet.end()); });
+    _model->startMonitor();
+    const auto deliver = [this](std::uint8_t byte) {
+        ports.deliver({byte});
+        queue.runReady();
+    };
+    deliver(1);
+    _link.setFilter([](Bytes /*packet*/) { return ByteBuffer{0}; });
+    deliver(2);
+    _link.setTap(nullptr);
+    deliver(3);
+    EXPECT_EQ(seen, (std::vector<ByteBuffer>{{1}, {0}}));
+}
+
 TEST_F(LinkPortsTest, EachStartChoosesItsName) {
     _crowd.taken = {kFixedName};
     _model->startMonitor();

@@ -51,11 +51,18 @@ TEST_F(WindowPackage, HoldsTheProgramAndWhatDesktopsShowOfIt) {
          {"bin/pallax-window", "share/applications/example.pallax.Pallax.desktop",
           "share/metainfo/example.pallax.Pallax.metainfo.xml",
           "share/icons/hicolor/scalable/apps/example.pallax.Pallax.svg",
-          "share/man/man1/pallax-window.1.gz", "share/doc/pallax-window/changelog.gz",
-          "share/doc/pallax-window/copyright"}) {
+          "share/dbus-1/services/example.pallax.Pallax.service",
+          "share/bash-completion/completions/pallax-window",
+          "share/zsh/vendor-completions/_pallax-window",
+          "share/fish/vendor_completions.d/pallax-window.fish", "share/man/man1/pallax-window.1.gz",
+          "share/doc/pallax-window/changelog.gz", "share/doc/pallax-window/copyright"}) {
         EXPECT_TRUE(fs::exists(folder.path(std::string("root/usr/") + name))) << name;
     }
     EXPECT_FALSE(fs::exists(folder.path("root/usr/bin/pallax")));
+    EXPECT_EQ(
+        contentOf(folder.path("root/usr/share/dbus-1/services/example.pallax.Pallax.service")),
+        "[D-BUS Service]\nName=example.pallax.Pallax\n"
+        "Exec=/usr/bin/pallax-window --gapplication-service\n");
 }
 
 TEST_F(WindowPackage, LintianFindsNoError) {
@@ -64,6 +71,42 @@ TEST_F(WindowPackage, LintianFindsNoError) {
     }
     const auto run = runCommand("lintian --allow-root --fail-on error " + package());
     EXPECT_EQ(run.status, 0) << run.out;
+}
+
+/// What bash offers for the last word of a command line of pallax-window.
+std::string offered(const std::string& words, int last) {
+    const std::string program = PALLAX_BINARY_DIR "/pallax-window";
+    return runCommand("cd / && bash -c 'source <(" + program + " completion bash); COMP_WORDS=(" +
+                      words + "); COMP_CWORD=" + std::to_string(last) +
+                      "; _pallax_window; echo ${COMPREPLY[@]}'")
+        .out;
+}
+
+TEST(WindowDescription, ShellsCompleteWhatAWindowTakes) {
+    EXPECT_EQ(offered("pallax-window dem", 1), "demo\n");
+    EXPECT_EQ(offered("pallax-window deco", 1), "\n");
+    EXPECT_EQ(offered("pallax-window --s", 1), "--safe --speed\n");
+    EXPECT_EQ(offered("pallax-window --pr", 1), "--profile\n") << "not --print";
+    EXPECT_EQ(offered("pallax-window demo l", 2), "lte\n");
+    EXPECT_EQ(offered("pallax-window demo --pl", 2), "\n");
+}
+
+TEST(WindowDescription, CompletionsAreWellFormed) {
+    const std::string program = PALLAX_BINARY_DIR "/pallax-window completion ";
+    if (isInstalled("zsh")) {
+        EXPECT_EQ(runCommand("bash -c 'zsh -n <(" + program + "zsh)'").out, "");
+    }
+    if (isInstalled("fish")) {
+        EXPECT_EQ(runCommand("bash -c 'fish -n <(" + program + "fish)'").out, "");
+    }
+}
+
+TEST(WindowDescription, ScreenshotsAreThoseOfTheDocuments) {
+    const std::string text = contentOf(source(".metainfo.xml"));
+    for (const char* name : {"window.png", "window-phone.png"}) {
+        EXPECT_NE(text.find(std::string("/docs/") + name + "</image>"), std::string::npos) << name;
+        EXPECT_TRUE(fs::exists(std::string(PALLAX_SOURCE_DIR "/docs/") + name)) << name;
+    }
 }
 
 TEST(WindowDescription, OfTheDesktopIsValid) {

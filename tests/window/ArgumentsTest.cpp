@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <filesystem>
+
 namespace pallax {
 namespace {
 
@@ -58,6 +60,43 @@ TEST(Arguments, HelpIsTheWindows) {
     EXPECT_EQ(end.status, kExitSuccess);
     EXPECT_EQ(end.text.substr(0, end.text.find('\n')),
               "Shows what a phone's cellular radio is doing, in a window.");
+}
+
+TEST(Arguments, ACompletionIsTheWindows) {
+    const auto options = windowOptions({"completion", "bash"});
+    const auto& end = std::get<ParseEnd>(options);
+    EXPECT_EQ(end.status, kExitSuccess);
+    EXPECT_EQ(end.text.substr(0, end.text.find('\n')),
+              "# Completion of pallax-window's command line, written by \"pallax-window completion "
+              "bash\".");
+    EXPECT_EQ(end.text.find("--print"), std::string::npos);
+    EXPECT_EQ(end.text.find("decode"), std::string::npos);
+    EXPECT_NE(end.text.find("--speed"), std::string::npos);
+    EXPECT_EQ(refusal({"manual", "pallax"}),
+              "pallax-window: \"manual\" has no window: use pallax manual (see pallax-window "
+              "--help)\n");
+}
+
+std::optional<std::string> key(std::vector<std::string> arguments) {
+    return keyOf(accepted(std::move(arguments)));
+}
+
+TEST(Arguments, TwoStartsShowTheSameIfSourceAndOptionsAreTheSame) {
+    const std::string folder = std::filesystem::current_path().string();
+    EXPECT_EQ(key({"drive.pcap"}), key({folder + "/./drive.pcap"}));
+    EXPECT_EQ(key({"modem"}), key({"modem"}));
+    EXPECT_EQ(key({}), key({}));
+    EXPECT_EQ(key({"demo", "lte"}), key({"demo", "lte"}));
+    EXPECT_NE(key({"demo", "lte"}), key({"demo", "gsm"}));
+    EXPECT_NE(key({"drive.pcap"}), key({"other.pcap"}));
+    EXPECT_NE(key({"drive.pcap"}), key({"drive.pcap", "--safe"}));
+    EXPECT_NE(key({"drive.pcap"}), key({"drive.pcap", "--speed", "2"}));
+    EXPECT_NE(key({}), key({"--connect", "car1"}));
+}
+
+TEST(Arguments, StandardInputAndALogOfTheShellAreNotShared) {
+    EXPECT_EQ(key({"-"}), std::nullopt);
+    EXPECT_EQ(key({"drive.pcap", "--log-level", "7"}), std::nullopt);
 }
 
 } // namespace

@@ -1,6 +1,4 @@
-#include "tests/cli/EndToEnd.h"
-#include "tests/doubles/Shell.h"
-#include "tests/ui/gtk/XServer.h"
+#include "tests/window/EndToEndWindow.h"
 
 #include <filesystem>
 #include <fstream>
@@ -9,65 +7,7 @@ namespace pallax {
 namespace {
 
 using doubles::CommandRun;
-using doubles::isInstalled;
-using doubles::runCommand;
 using std::chrono::milliseconds;
-using std::chrono::seconds;
-
-/// The real program in an X server and on a session bus of its own, driven as a screen reader does.
-class EndToEndWindow : public EndToEnd {
-protected:
-    void SetUp() override {
-        if (_server.display().empty() || !isInstalled("dbus-run-session") ||
-            runCommand("/usr/bin/python3 -c 'import gi; gi.require_version(\"Atspi\", \"2.0\")'")
-                    .status != 0) {
-            GTEST_SKIP() << "Xvfb, dbus-run-session or python3-gi with Atspi is not installed";
-        }
-        world.environment = {"DISPLAY=" + _server.display(), "GDK_BACKEND=x11",
-                             "GSK_RENDERER=cairo",           "GSETTINGS_BACKEND=memory",
-                             "ADW_DISABLE_PORTAL=1",         "PATH=/usr/bin:/bin",
-                             "HOME=" + world.path()};
-    }
-
-    /// Snapshots can be saved into this folder, which is the marker, too.
-    std::string offerSaving(const std::string& folder) const {
-        std::filesystem::create_directories(world.path("config/pallax"));
-        std::filesystem::create_directories(world.path("marker"));
-        std::ofstream(world.path("config/pallax/pallax.conf"))
-            << "snapshot-directory = " << folder
-            << "\nsave-button-marker = " << world.path("marker") << "\n";
-        return folder;
-    }
-
-    /// Starts the program with the arguments, takes the steps of drive.py, and ends the program
-    /// with SIGTERM unless the steps end it. The status is the program's; the text is what both
-    /// wrote.
-    CommandRun drive(const std::string& arguments, const std::string& steps) const {
-        const std::string script = world.path("script");
-        std::ofstream(script) << PALLAX_PROGRAM " " << arguments << " & p=$!\n"
-                              << "/usr/bin/python3 -W ignore " PALLAX_SOURCE_DIR
-                                 "/tests/window/drive.py "
-                              << steps << " || echo DRIVE FAILED\n"
-                              << "kill -TERM $p 2>/dev/null; wait $p; exit $?\n";
-        std::string command = "env -i ";
-        for (const std::string& variable : doubles::programEnvironment(world)) {
-            command += variable + " ";
-        }
-        return runCommand(command + "dbus-run-session -- sh " + script);
-    }
-
-    std::string sample(const std::string& name) const {
-        return PALLAX_SOURCE_DIR "/samples/" + name;
-    }
-
-    void expectDriven(const CommandRun& run, int status = 0) const {
-        EXPECT_EQ(run.out.find("DRIVE FAILED"), std::string::npos) << run.out;
-        EXPECT_EQ(run.status, status) << run.out;
-    }
-
-private:
-    doubles::XServer _server;
-};
 
 TEST_F(EndToEndWindow, ARecordingIsOpenedAndWalkedThroughByKeys) {
     expectDriven(drive(sample("lte-drive.pcap") + " --speed max",

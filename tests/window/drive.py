@@ -8,6 +8,9 @@
   focus NAME       goes to it
   key KEY          presses a key: Escape, Right, m
   type NAME=TEXT   puts the text into the field with this name
+  menu NAME        opens the menu and chooses the entry with this name
+  entry NAME       chooses the entry in the menu that is open
+  windows COUNT    waits until so many windows are open
   tree             prints all names
 
 A * in a NAME stands for any text. Prints what failed and ends with status 1.
@@ -34,8 +37,11 @@ def children(node):
 
 def windows():
     for application in children(Atspi.get_desktop(0)):
-        if application is not None and "pallax" in (application.get_name() or "").lower():
-            yield from children(application)
+        try:
+            if application is not None and "pallax" in (application.get_name() or "").lower():
+                yield from children(application)
+        except Exception:  # it is gone
+            continue
 
 
 def walk(node):
@@ -60,6 +66,12 @@ def is_shown(node):
     return states.contains(Atspi.StateType.VISIBLE)
 
 
+def is_drawn(node):
+    """Of a dialog's buttons, which it has twice, one above the other and side by side."""
+    node.clear_cache()
+    return node.get_component_iface().get_size().x > 0
+
+
 def find(name, role=None):
     """The last one: pages that are covered by others come before them."""
     for window in reversed(list(windows())):
@@ -68,6 +80,8 @@ def find(name, role=None):
                 own = node.get_name() or ""
                 matches = fnmatch.fnmatchcase(own, name.replace("[", "[[]"))
                 if matches and (role is None or node.get_role() == role) and is_shown(node):
+                    if role == Atspi.Role.PUSH_BUTTON and not is_drawn(node):
+                        continue
                     return node
             except Exception:  # it is gone
                 continue
@@ -149,6 +163,14 @@ def step(verb, argument):
         row = await_result(lambda: find(argument), "no row " + argument)
         walk_to(row)
         press_key("Return")
+    elif verb == "menu":
+        step("press", "Menu")
+        step("entry", argument)
+    elif verb == "entry":
+        entry = await_result(lambda: find(argument, Atspi.Role.MENU_ITEM), "no entry " + argument)
+        entry.get_action_iface().do_action(0)
+    elif verb == "windows":
+        await_result(lambda: len(list(windows())) == int(argument), "not so many windows: " + argument)
     elif verb == "focus":
         walk_to(await_result(lambda: find(argument), "no row " + argument))
     elif verb == "key":

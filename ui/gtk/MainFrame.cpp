@@ -311,7 +311,10 @@ void MainFrame::endWork() {
     _work.hide();
 }
 
-void MainFrame::present() {
+void MainFrame::present(const std::string& token) {
+    if (!token.empty()) {
+        gtk_window_set_startup_id(window(), token.c_str());
+    }
     gtk_window_present(window());
 }
 

@@ -41,7 +41,8 @@ public:
     /// What the frame calls for: the topmost pane has changed, or its title or toolbar.
     void refresh();
     void modalChanged();
-    void present();
+    /// With a token of the desktop ("": none), which lets the window come to the front.
+    void present(const std::string& token = "");
     void hide();
     /// Shows one after the other.
     void showAlert(const ui::Alert& alert);
