@@ -35,6 +35,7 @@ ViewerSession::ViewerSession(Setup setup)
                }}),
       _preferences(FilePreferences::userFolder()) {
     mask(setup.isSafe);
+    _link.setPause(setup.pause);
 }
 
 void ViewerSession::attach(ui::Toolkit& toolkit) {

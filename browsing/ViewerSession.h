@@ -17,6 +17,7 @@
 #include "travel/Travel.h"
 #include "watching/AlarmWatch.h"
 
+#include <chrono>
 #include <cstdint>
 #include <functional>
 #include <memory>
@@ -62,6 +63,8 @@ public:
         ChildService* child; ///< null for a service of this machine
         Source source;
         Face face;
+        /// Packets that come slowly are taken together, after such pauses (SocketLocalPort).
+        std::chrono::milliseconds pause{0};
     };
 
     explicit ViewerSession(Setup setup);

@@ -1,6 +1,7 @@
 #include "window/WindowSession.h"
 
 #include "timeline/Timeline.h"
+#include "ui/gtk/ShownText.h"
 #include "ui/gtk/Translation.h"
 #include "window/ShownValue.h"
 
@@ -15,6 +16,8 @@ using Wish = gtk::TimeBar::Wish;
 using Direction = Travel::Direction;
 
 constexpr std::chrono::milliseconds kPlayedFrame{200};
+/// Short beside the two seconds of a tick. Without it, most of a window's cost is waking up.
+constexpr std::chrono::milliseconds kPacketPause{200};
 
 } // namespace
 
@@ -30,7 +33,8 @@ WindowSession::WindowSession(Setup setup)
                                                    .directory = std::move(setup.directory),
                                                    .child = setup.child,
                                                    .source = setup.request.options.source,
-                                                   .face = face()}),
+                                                   .face = face(),
+                                                   .pause = kPacketPause}),
       _instant(_viewer.travel(), _toolkit), _timeBar(setup.guard, timeActions()),
       _profile(setup.request.profile), _values(valueSource()) {
     gtk_widget_set_visible(_timeBar.widget(), FALSE);
@@ -72,7 +76,7 @@ ViewerSession::Face WindowSession::face() {
 
 /// Comes also while there are no packets, when ages grow.
 void WindowSession::tick() {
-    if (gtk_widget_get_mapped(_overview.widget()) != FALSE) {
+    if (gtk::isSeen(_overview.widget())) {
         _overview.show(_viewer.overview());
     }
     showTimeBar();
