@@ -13,6 +13,7 @@
 #include "window/WindowSession.h"
 
 #include <adwaita.h>
+#include <algorithm>
 #include <csignal>
 #include <filesystem>
 #include <memory>
@@ -185,6 +186,16 @@ private:
     gtk::Ref<GtkFileChooserNative> _chooser; ///< the latest
 };
 
+/// Whether OpenGL has a graphics processor. Without one, this processor would do its work, which
+/// takes longer than the toolkit's own drawing, and 70 MB more.
+bool hasGraphicsProcessor() {
+    std::error_code missing;
+    const std::filesystem::directory_iterator devices("/dev/dri", missing);
+    return std::any_of(begin(devices), end(devices), [](const auto& device) {
+        return device.path().filename().string().starts_with("render");
+    });
+}
+
 /// Beside the program where it was built, or where it is installed.
 std::string translationsFolder() {
     const std::filesystem::path folder = std::filesystem::path(windowProgram()).parent_path();
@@ -200,6 +211,9 @@ ExitStatus runWindow(const BrowseOptions& options) {
     const Interruption interruption;
     gtk_disable_setlocale(); // numbers are written and read in the same way everywhere
     gtk::useTranslations(translationsFolder().c_str());
+    if (!hasGraphicsProcessor()) {
+        g_setenv("GSK_RENDERER", "cairo", FALSE); // unless the user has chosen
+    }
     if (gtk_init_check() == FALSE) {
         complain("There is no display for a window; pallax shows the same in a terminal.");
         return kExitFailure;

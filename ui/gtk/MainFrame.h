@@ -89,6 +89,7 @@ private:
     void buildSearch();
     void filter();
     void showToolbarItems(const ui::BarItems& items);
+    void reloadTables();
     void showRemarks();
     void back();
     gboolean handleKey(guint key, guint code, GdkModifierType state);
@@ -126,6 +127,7 @@ private:
     std::string _note;
     std::string _stream;
     std::string _alarms;
+    std::string _shownRemarks;
     std::vector<std::pair<gpointer, gulong>> _handlers;
 };
 

@@ -202,7 +202,7 @@ void WidgetTable::reloadData() {
         gtk_string_list_splice(_rows.get(), had, 0, texts.data());
     }
     showPlaceholder();
-    if (gtk_widget_get_mapped(GTK_WIDGET(_list)) == 0) {
+    if (!isSeen(GTK_WIDGET(_list))) {
         for (auto& [item, bound] : _bound) { // filled when it is seen
             bound.isStale = true;
         }
