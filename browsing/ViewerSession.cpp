@@ -38,6 +38,7 @@ ViewerSession::ViewerSession(Setup setup)
                }}),
       _preferences(FilePreferences::userFolder()) {
     mask(setup.isSafe);
+    _link.setPause(setup.pause);
 }
 
 void ViewerSession::attach(ui::Toolkit& toolkit) {

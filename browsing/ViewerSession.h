@@ -18,6 +18,7 @@
 #include "ui/contents/QueryContent.h"
 #include "watching/AlarmWatch.h"
 
+#include <chrono>
 #include <cstdint>
 #include <functional>
 #include <memory>
@@ -64,6 +65,8 @@ public:
         ChildService* child; ///< null for a service of this machine
         Source source;
         Face face;
+        /// Packets that come slowly are taken together, after such pauses (SocketLocalPort).
+        std::chrono::milliseconds pause{0};
     };
 
     explicit ViewerSession(Setup setup);

@@ -17,11 +17,12 @@ set(CMAKE_FIND_ROOT_PATH_MODE_PROGRAM NEVER)
 set(CMAKE_FIND_ROOT_PATH_MODE_LIBRARY ONLY)
 set(CMAKE_FIND_ROOT_PATH_MODE_INCLUDE ONLY)
 set(CMAKE_FIND_ROOT_PATH_MODE_PACKAGE ONLY)
-# Libraries that a library needs, for the linker and for the programs that run here.
+# Libraries that a library needs, for the linker.
 set(libraries ${sysroot}/usr/lib/${triplet} ${sysroot}/lib/${triplet})
 list(TRANSFORM libraries REPLACE "(.+)" "-L\\1 -Wl,-rpath-link,\\1" OUTPUT_VARIABLE links)
 list(JOIN links " " CMAKE_EXE_LINKER_FLAGS_INIT)
-list(JOIN libraries ":" library_path)
-set(CMAKE_CROSSCOMPILING_EMULATOR
-    qemu-${CMAKE_SYSTEM_PROCESSOR} -L /usr/${triplet} -E LD_LIBRARY_PATH=${library_path}
-)
+# Those that pkg-config knows.
+set(ENV{PKG_CONFIG_SYSROOT_DIR} ${sysroot})
+set(ENV{PKG_CONFIG_LIBDIR} ${sysroot}/usr/lib/${triplet}/pkgconfig:${sysroot}/usr/share/pkgconfig)
+# Programs find their libraries, and the files of these, in the sysroot.
+set(CMAKE_CROSSCOMPILING_EMULATOR qemu-${CMAKE_SYSTEM_PROCESSOR} -L ${sysroot})

@@ -20,6 +20,8 @@ namespace {
 constexpr std::size_t kChunkSize = std::size_t{64} << 10U;
 /// The delay before the next try after descriptors or memory have run out.
 constexpr std::chrono::milliseconds kAcceptRetryDelay{100};
+/// A stream that brings more frames in a pause is read without pauses: the socket would be full.
+constexpr std::size_t kFewFrames = 64;
 
 } // namespace
 
@@ -55,7 +57,8 @@ struct SocketLocalPort::State : std::enable_shared_from_this<State> {
 class SocketLocalPort::Session : public std::enable_shared_from_this<Session> {
 public:
     Session(const std::shared_ptr<State>& port, Descriptor socket)
-        : _port(port), _socket(std::move(socket)), _watch(port->setup.queue, _socket.number()) {}
+        : _port(port), _socket(std::move(socket)),
+          _watch(std::in_place, port->setup.queue, _socket.number()) {}
 
     void start() { stepLater(); }
 
@@ -63,6 +66,7 @@ private:
     void stepLater();
     void step();
     bool readChunk(State& port);
+    void awaitMore(const State& port);
     void handle(const std::shared_ptr<State>& port);
     void tellRemark(SourceTimeListener* times, const PortFrame& frame);
     void deliver(const std::shared_ptr<State>& port, const PortFrame& frame);
@@ -72,7 +76,7 @@ private:
 
     std::weak_ptr<State> _port;
     Descriptor _socket;
-    DescriptorWatch _watch; // declared after the socket that it watches
+    std::optional<DescriptorWatch> _watch; // declared after the socket that it watches
     PortFrameParser _parser;
     std::optional<PortFrame> _frame; // complete, not yet delivered
     std::array<std::uint8_t, kChunkSize> _chunk{};
@@ -80,6 +84,7 @@ private:
     ByteBuffer _answer;
     std::size_t _answered = 0; // bytes of _answer already sent
     bool _tellsTime = false;
+    std::size_t _frames = 0; // since the data last ran out
 };
 
 void SocketLocalPort::State::acceptAll() {
@@ -143,7 +148,7 @@ void SocketLocalPort::Session::step() {
 bool SocketLocalPort::Session::readChunk(State& port) {
     const Transfer transfer = receiveFrom(_socket, _chunk);
     if (transfer.state == Transfer::State::WouldBlock) {
-        _watch.onceReadable([this] { stepLater(); });
+        awaitMore(port);
         return false;
     }
     if (transfer.state == Transfer::State::Closed) {
@@ -152,6 +157,24 @@ bool SocketLocalPort::Session::readChunk(State& port) {
     }
     _unread = Bytes(_chunk).first(transfer.count);
     return true;
+}
+
+/// In a pause, there is no watch: it would wake up for each frame.
+void SocketLocalPort::Session::awaitMore(const State& port) {
+    const bool isPausing = port.setup.pause > std::chrono::milliseconds(0) && _frames < kFewFrames;
+    _frames = 0;
+    if (!isPausing) {
+        return _watch->onceReadable([this] { stepLater(); });
+    }
+    _watch.reset();
+    port.setup.queue.after(port.setup.pause, [weak = weak_from_this()] {
+        const auto self = weak.lock();
+        const auto open = self ? self->_port.lock() : nullptr;
+        if (open) {
+            self->_watch.emplace(open->setup.queue, self->_socket.number());
+            self->_watch->onceReadable([session = self.get()] { session->stepLater(); });
+        }
+    });
 }
 
 void SocketLocalPort::Session::handle(const std::shared_ptr<State>& port) {
@@ -168,6 +191,7 @@ void SocketLocalPort::Session::handle(const std::shared_ptr<State>& port) {
     }
     const PortFrame frame = std::move(*_frame);
     _frame.reset();
+    ++_frames;
     switch (frame.header.kind) {
     case FrameKind::Message:
         if (times != nullptr) {
@@ -250,7 +274,7 @@ void SocketLocalPort::Session::flush() {
             return;
         }
         if (transfer.state == Transfer::State::WouldBlock) {
-            _watch.onceWritable([this] { flush(); });
+            _watch->onceWritable([this] { flush(); });
             return;
         }
         _answered += transfer.count;

@@ -3,6 +3,7 @@
 #include "host/Descriptor.h"
 #include "platform/MessagePort.h"
 
+#include <chrono>
 #include <memory>
 #include <string>
 
@@ -21,6 +22,9 @@ public:
         Descriptor listener; ///< listens at `path`
         MessagePorts::ReceiveCallback receive;
         SourceTimeListener* times; ///< may be null
+        /// How long a connection without data is left alone, so that the frames that come meanwhile
+        /// are handled together: waking up costs more than handling a frame. Zero: never.
+        std::chrono::milliseconds pause{0};
     };
 
     /// An inert port, which was never valid.

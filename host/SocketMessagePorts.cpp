@@ -61,7 +61,7 @@ MessagePorts::Local SocketMessagePorts::createLocal(std::string_view name,
         return {};
     }
     return {std::make_unique<SocketLocalPort>(SocketLocalPort::Setup{
-                _queue, *path, std::move(listener), std::move(receive), _listener}),
+                _queue, *path, std::move(listener), std::move(receive), _listener, _pause}),
             false};
 }
 

@@ -3,6 +3,7 @@
 #include "host/SocketDirectory.h"
 #include "platform/MessagePort.h"
 
+#include <chrono>
 #include <string>
 
 namespace pallax {
@@ -22,6 +23,9 @@ public:
     Local createLocal(std::string_view name, ReceiveCallback receive) override;
     std::unique_ptr<RemoteMessagePort> createRemote(std::string_view name) override;
 
+    /// As SocketLocalPort::Setup, for the local ports that follow.
+    void setPause(std::chrono::milliseconds pause) { _pause = pause; }
+
     /// Whether a living port has this name, even if it accepts no connection now.
     bool isTaken(std::string_view name) const;
     /// Why the latest createLocal failed: one sentence.
@@ -32,6 +36,7 @@ private:
     AsioMainQueue& _queue;
     SocketDirectory _directory;
     SourceTimeListener* _listener;
+    std::chrono::milliseconds _pause{0};
     std::string _lastError;
 };
 

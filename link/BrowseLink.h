@@ -45,6 +45,8 @@ public:
     ModemLink::Platform platform();
     /// See LinkPorts.
     void setFilter(LinkPorts::PacketFilter filter) { _linkPorts.setFilter(std::move(filter)); }
+    /// See SocketMessagePorts.
+    void setPause(std::chrono::milliseconds pause) { _socketPorts.setPause(pause); }
     /// See LinkPorts.
     void setTap(LinkPorts::PacketTap tap) { _linkPorts.setTap(std::move(tap)); }
     /// See LinkPorts.

@@ -18,6 +18,7 @@
 #include "window/WindowSession.h"
 
 #include <adwaita.h>
+#include <algorithm>
 #include <csignal>
 #include <filesystem>
 #include <memory>

@@ -2,6 +2,7 @@
 
 #include "timeline/Timeline.h"
 #include "ui/contents/TravelWords.h"
+#include "ui/gtk/ShownText.h"
 #include "ui/gtk/Translation.h"
 
 #include <chrono>
@@ -17,6 +18,8 @@ using Direction = Travel::Direction;
 
 constexpr std::chrono::milliseconds kPlayedFrame{200};
 constexpr std::chrono::minutes kLongStep{1};
+/// Short beside the two seconds of a tick. Without it, most of a window's cost is waking up.
+constexpr std::chrono::milliseconds kPacketPause{200};
 
 } // namespace
 
@@ -33,7 +36,8 @@ WindowSession::WindowSession(Setup setup)
                .directory = std::move(setup.directory),
                .child = setup.child,
                .source = setup.request.options.source,
-               .face = face()}),
+               .face = face(),
+               .pause = kPacketPause}),
       _instant(_viewer.travel(), _toolkit), _timeBar(setup.guard, timeActions()),
       _profile(setup.request.profile), _pages(setup.frame, setup.guard, valueSource()),
       _changes(setup.frame, _viewer.travel()),
@@ -88,7 +92,7 @@ ViewerSession::Face WindowSession::face() {
 
 /// Comes also while there are no packets, when ages grow.
 void WindowSession::tick() {
-    if (gtk_widget_get_mapped(_overview.widget()) != FALSE) {
+    if (gtk::isSeen(_overview.widget())) {
         _overview.show(_viewer.overview());
     }
     showTimeBar();

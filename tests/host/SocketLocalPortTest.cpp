@@ -61,6 +61,33 @@ TEST_F(SocketLocalPortTest, DeliversMessagesInOrder) {
     EXPECT_EQ(_received, (Received{{0, "one"}, {-7, ""}, {0, "three"}}));
 }
 
+TEST_F(SocketLocalPortTest, FramesThatComeSlowlyAreTakenTogetherAfterAPause) {
+    _ports.setPause(200ms);
+    const auto local = open("a.port", collect());
+    const auto remote = _ports.createRemote("a.port");
+    ASSERT_NE(remote, nullptr);
+    EXPECT_EQ(post(*remote, 0, "one"), SendError::None);
+    ASSERT_TRUE(runUntil(_queue, [&] { return _received.size() == 1; }));
+    const auto begin = std::chrono::steady_clock::now();
+    EXPECT_EQ(post(*remote, 0, "two"), SendError::None);
+    ASSERT_TRUE(runUntil(_queue, [&] { return _received.size() == 2; }));
+    EXPECT_GE(std::chrono::steady_clock::now() - begin, 150ms);
+}
+
+TEST_F(SocketLocalPortTest, AStreamWithManyFramesIsReadWithoutPauses) {
+    constexpr std::size_t kMany = 64;
+    _ports.setPause(1h);
+    const auto local = open("a.port", collect());
+    const auto remote = _ports.createRemote("a.port");
+    ASSERT_NE(remote, nullptr);
+    for (std::size_t frame = 0; frame < kMany; ++frame) {
+        EXPECT_EQ(post(*remote, 0, "frame"), SendError::None);
+    }
+    ASSERT_TRUE(runUntil(_queue, [&] { return _received.size() == kMany; }));
+    EXPECT_EQ(post(*remote, 0, "next"), SendError::None);
+    EXPECT_TRUE(runUntil(_queue, [&] { return _received.size() == kMany + 1; }));
+}
+
 TEST_F(SocketLocalPortTest, TheSocketIsItsUsersAlone) {
     const auto local = open("a.port", collect());
     struct stat status {};

@@ -131,12 +131,21 @@ void MainFrame::listen() {
     for (const char* property : {"notify::gtk-xft-dpi", "notify::gtk-font-name"}) {
         _handlers.emplace_back(settings, onSignal(settings, property, _guard, [this] {
                                    (void)_metrics.adoptSettings();
-                                   if (_stack != nullptr) {
-                                       for (const auto& screen : _stack->screens()) {
-                                           screen->table().reloadData();
-                                       }
-                                   }
+                                   reloadTables();
                                }));
+    }
+    onSignal(_window.get(), "realize", _guard, [this] {
+        GdkSurface* surface = gtk_native_get_surface(GTK_NATIVE(_window.get()));
+        const auto changed = [this] { reloadTables(); }; // which were not filled while hidden
+        _handlers.emplace_back(surface, onSignal(surface, "notify::state", _guard, changed));
+    });
+}
+
+void MainFrame::reloadTables() {
+    if (_stack != nullptr) {
+        for (const auto& screen : _stack->screens()) {
+            screen->table().reloadData();
+        }
     }
 }
 
@@ -246,8 +255,7 @@ void MainFrame::showToolbarItems(const ui::BarItems& items) {
             const bool isHidden = !indicator->isSpinning && indicator->hidesWhenStopped;
             gtk_widget_set_visible(GTK_WIDGET(_spinner), isHidden ? FALSE : TRUE);
         } else if (const auto* label = std::get_if<ui::Label>(&item)) {
-            const auto attributes = _metrics.attributes(label->font);
-            gtk_label_set_attributes(_status, attributes.get());
+            _metrics.setFont(_status, label->font);
             gtk_label_set_text(_status, shownText(label->text).c_str());
         } else if (const auto* button = std::get_if<ui::SaveButton>(&item)) {
             _saveAction = button->action;
@@ -367,6 +375,9 @@ void MainFrame::showRemarks() {
         if (!part->empty()) {
             text += (text.empty() ? "" : " · ") + *part;
         }
+    }
+    if (text == std::exchange(_shownRemarks, text)) {
+        return;
     }
     showText(_remarks, text);
     gtk_widget_set_tooltip_text(GTK_WIDGET(_remarks),

@@ -105,6 +105,7 @@ private:
     GtkWidget* buildToolbar();
     void adopt(WidgetNavigation* stack);
     void showToolbarItems(const ui::BarItems& items);
+    void reloadTables();
     void showRemarks();
     void showListButton();
     void back();
@@ -146,6 +147,7 @@ private:
     std::string _note;
     std::string _stream;
     std::string _alarms;
+    std::string _shownRemarks;
     std::vector<std::pair<gpointer, gulong>> _handlers;
 };
 

@@ -5,7 +5,6 @@
 #include "ui/gtk/ShownText.h"
 #include "ui/gtk/Translation.h"
 
-#include <algorithm>
 #include <utility>
 
 namespace pallax::gtk {
@@ -27,26 +26,36 @@ std::string joined(const std::vector<std::string>& words) {
 
 } // namespace
 
-OverviewView::OverviewView() : _page(owned(GTK_BOX(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0)))) {
-    build({});
+OverviewView::OverviewView()
+    : _page(owned(GTK_BOX(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0)))),
+      _nothing(adw_status_page_new()), _groupsPage(adw_preferences_page_new()) {
+    adw_status_page_set_icon_name(ADW_STATUS_PAGE(_nothing), "network-wireless-symbolic");
+    adw_status_page_set_title(ADW_STATUS_PAGE(_nothing),
+                              translated("Nothing is known about the radio."));
+    for (GtkWidget* page : {_nothing, _groupsPage}) {
+        gtk_widget_set_vexpand(page, TRUE);
+        gtk_box_append(_page.get(), page);
+    }
+    show({});
 }
 
-/// Texts change in place, so that the place on the page and the focus stay.
+/// Widgets stay, so that the place on the page and the focus do, too: making them takes much longer
+/// than changing their texts. Those that are not needed now are hidden.
 void OverviewView::show(const Overview& overview) {
     const std::vector<Group> groups = groupsOf(overview);
-    const bool isSame =
-        groups.size() == _rows.size() && std::equal(groups.begin(), groups.end(), _rows.begin(),
-                                                    [](const Group& group, const auto& rows) {
-                                                        return group.rows.size() == rows.size();
-                                                    });
-    if (!isSame) {
-        build(groups);
-    }
-    for (std::size_t group = 0; group < groups.size(); ++group) {
-        adw_preferences_group_set_title(_groups[group], shownMarkup(groups[group].title).c_str());
-        for (std::size_t row = 0; row < groups[group].rows.size(); ++row) {
-            fill(_rows[group][row], groups[group].rows[row]);
+    gtk_widget_set_visible(_nothing, groups.empty() ? TRUE : FALSE);
+    gtk_widget_set_visible(_groupsPage, groups.empty() ? FALSE : TRUE);
+    for (std::size_t index = 0; index < groups.size(); ++index) {
+        if (index == _groups.size()) {
+            auto* made = ADW_PREFERENCES_GROUP(adw_preferences_group_new());
+            adw_preferences_page_add(ADW_PREFERENCES_PAGE(_groupsPage), made);
+            _groups.push_back({made, {}});
         }
+        fill(_groups[index], groups[index]);
+    }
+    for (std::size_t index = 0; index < _groups.size(); ++index) {
+        gtk_widget_set_visible(GTK_WIDGET(_groups[index].group),
+                               index < groups.size() ? TRUE : FALSE);
     }
 }
 
@@ -103,33 +112,19 @@ std::vector<OverviewView::Group> OverviewView::groupsOf(const Overview& overview
     return groups;
 }
 
-void OverviewView::build(const std::vector<Group>& groups) {
-    while (GtkWidget* child = gtk_widget_get_first_child(widget())) {
-        gtk_box_remove(_page.get(), child);
-    }
-    _groups.clear();
-    _rows.clear();
-    if (groups.empty()) {
-        GtkWidget* nothing = adw_status_page_new();
-        adw_status_page_set_icon_name(ADW_STATUS_PAGE(nothing), "network-wireless-symbolic");
-        adw_status_page_set_title(ADW_STATUS_PAGE(nothing),
-                                  translated("Nothing is known about the radio."));
-        gtk_widget_set_vexpand(nothing, TRUE);
-        return gtk_box_append(_page.get(), nothing);
-    }
-    _groupsPage = ADW_PREFERENCES_PAGE(adw_preferences_page_new());
-    gtk_widget_set_vexpand(GTK_WIDGET(_groupsPage), TRUE);
-    for (const Group& group : groups) {
-        auto* made = ADW_PREFERENCES_GROUP(adw_preferences_group_new());
-        std::vector<RowWidgets>& rows = _rows.emplace_back();
-        for (std::size_t row = 0; row < group.rows.size(); ++row) {
-            rows.push_back(makeRow());
-            adw_preferences_group_add(made, GTK_WIDGET(rows.back().row));
+void OverviewView::fill(GroupWidgets& widgets, const Group& group) {
+    adw_preferences_group_set_title(widgets.group, shownMarkup(group.title).c_str());
+    for (std::size_t index = 0; index < group.rows.size(); ++index) {
+        if (index == widgets.rows.size()) {
+            widgets.rows.push_back(makeRow());
+            adw_preferences_group_add(widgets.group, GTK_WIDGET(widgets.rows.back().row));
         }
-        adw_preferences_page_add(_groupsPage, made);
-        _groups.push_back(made);
+        fill(widgets.rows[index], group.rows[index]);
     }
-    gtk_box_append(_page.get(), GTK_WIDGET(_groupsPage));
+    for (std::size_t index = 0; index < widgets.rows.size(); ++index) {
+        gtk_widget_set_visible(GTK_WIDGET(widgets.rows[index].row),
+                               index < group.rows.size() ? TRUE : FALSE);
+    }
 }
 
 OverviewView::RowWidgets OverviewView::makeRow() {
@@ -142,10 +137,14 @@ OverviewView::RowWidgets OverviewView::makeRow() {
     gtk_widget_add_css_class(value, "numeric");
     adw_action_row_add_suffix(ADW_ACTION_ROW(row), value);
     adw_action_row_add_suffix(ADW_ACTION_ROW(row), bar);
-    return {ADW_ACTION_ROW(row), GTK_LABEL(value), GTK_LEVEL_BAR(bar)};
+    return {ADW_ACTION_ROW(row), GTK_LABEL(value), GTK_LEVEL_BAR(bar), {}};
 }
 
-void OverviewView::fill(const RowWidgets& widgets, const Row& row) {
+void OverviewView::fill(RowWidgets& widgets, const Row& row) {
+    if (widgets.shown == row) {
+        return;
+    }
+    widgets.shown = row;
     adw_preferences_row_set_title(ADW_PREFERENCES_ROW(widgets.row), shownText(row.title).c_str());
     adw_action_row_set_subtitle(widgets.row, shownText(row.subtitle).c_str());
     showText(widgets.value, row.value);

@@ -28,6 +28,7 @@ private:
         std::string subtitle = {};
         std::string value = {};
         std::optional<double> share = {};
+        bool operator==(const Row&) const = default;
     };
     struct Group {
         std::string title;
@@ -37,18 +38,23 @@ private:
         AdwActionRow* row;
         GtkLabel* value;
         GtkLevelBar* bar;
+        std::optional<Row> shown;
+    };
+    struct GroupWidgets {
+        AdwPreferencesGroup* group;
+        std::vector<RowWidgets> rows;
     };
 
     static std::vector<Group> groupsOf(const Overview& overview);
     static void addCells(std::vector<Group>& groups, const Status& status);
-    void build(const std::vector<Group>& groups);
-    RowWidgets makeRow();
-    static void fill(const RowWidgets& widgets, const Row& row);
+    static RowWidgets makeRow();
+    static void fill(GroupWidgets& widgets, const Group& group);
+    static void fill(RowWidgets& widgets, const Row& row);
 
-    Ref<GtkBox> _page; ///< the groups, or words that nothing is known
-    AdwPreferencesPage* _groupsPage = nullptr;
-    std::vector<AdwPreferencesGroup*> _groups;
-    std::vector<std::vector<RowWidgets>> _rows; ///< of each group
+    Ref<GtkBox> _page;
+    GtkWidget* _nothing; ///< words that nothing is known; the page owns it and what follows
+    GtkWidget* _groupsPage;
+    std::vector<GroupWidgets> _groups; ///< as many as were ever needed
 };
 
 } // namespace pallax::gtk

@@ -61,12 +61,15 @@ ui::Size PangoMetrics::measure(std::string_view text, const ui::Font& font) cons
     return {width / _scale, height / _scale};
 }
 
-std::unique_ptr<PangoAttrList, PangoMetrics::ListUnref>
-PangoMetrics::attributes(const ui::Font& font) const {
-    std::unique_ptr<PangoAttrList, ListUnref> list(pango_attr_list_new());
+void PangoMetrics::setFont(GtkLabel* label, const ui::Font& font) const {
+    PangoAttrList* list = pango_attr_list_new();
     const FontDescription drawn = description(family(font.face), font, _scale);
-    pango_attr_list_insert(list.get(), pango_attr_font_desc_new(drawn.get()));
-    return list;
+    pango_attr_list_insert(list, pango_attr_font_desc_new(drawn.get()));
+    PangoAttrList* shown = gtk_label_get_attributes(label);
+    if (shown == nullptr || pango_attr_list_equal(shown, list) == FALSE) {
+        gtk_label_set_attributes(label, list);
+    }
+    pango_attr_list_unref(list);
 }
 
 } // namespace pallax::gtk

@@ -27,11 +27,9 @@ public:
 
     int pixels(double points) const { return static_cast<int>(points * _scale); }
 
-    /// The attributes of a label in this font.
-    struct ListUnref {
-        void operator()(PangoAttrList* list) const { pango_attr_list_unref(list); }
-    };
-    std::unique_ptr<PangoAttrList, ListUnref> attributes(const ui::Font& font) const;
+    /// Gives a label this font. A label that has it already is left alone, because it would be laid
+    /// out anew, and its window with it.
+    void setFont(GtkLabel* label, const ui::Font& font) const;
 
 private:
     std::string family(ui::FontFace face) const;

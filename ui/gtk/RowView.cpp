@@ -127,9 +127,8 @@ void RowView::place(GtkLabel* label, const ui::Label& content, const ui::Rect& a
     const double scale = _metrics.scale();
     const ui::Rect& frame = content.frame;
     // What has changed is bold, for which the layouts leave room, and not only coloured.
-    const auto attributes = _metrics.attributes(
-        isBold ? ui::Font{ui::FontFace::BoldSystem, content.font.size} : content.font);
-    gtk_label_set_attributes(label, attributes.get());
+    _metrics.setFont(label,
+                     isBold ? ui::Font{ui::FontFace::BoldSystem, content.font.size} : content.font);
     gtk_label_set_text(label, shownText(content.text).c_str());
     // Where nothing scrolls, a text that is too long ends in dots.
     const double room = area.origin.x + area.size.width - frame.origin.x;
@@ -225,8 +224,7 @@ void RowView::showAge(const ui::CellContents& contents, const std::string& age) 
     const bool hasRoom =
         contents.labels.size() > 1 && x >= name.origin.x + name.size.width + kMargin;
     showText(_age, hasRoom ? age : "");
-    const auto attributes = _metrics.attributes(kFont);
-    gtk_label_set_attributes(_age, attributes.get());
+    _metrics.setFont(_age, kFont);
     gtk_fixed_move(_content, GTK_WIDGET(_age), std::round(x * _metrics.scale()),
                    std::round((kRowHeight - extent.height) / 2 * _metrics.scale()));
 }

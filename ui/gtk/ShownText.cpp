@@ -32,4 +32,13 @@ void nameWidget(GtkWidget* widget, const char* name) {
     gtk_accessible_update_property(GTK_ACCESSIBLE(widget), GTK_ACCESSIBLE_PROPERTY_LABEL, name, -1);
 }
 
+bool isSeen(GtkWidget* widget) {
+    if (gtk_widget_get_mapped(widget) == FALSE) {
+        return false;
+    }
+    GdkSurface* surface = gtk_native_get_surface(gtk_widget_get_native(widget));
+    return !GDK_IS_TOPLEVEL(surface) ||
+           (gdk_toplevel_get_state(GDK_TOPLEVEL(surface)) & GDK_TOPLEVEL_STATE_MINIMIZED) == 0;
+}
+
 } // namespace pallax::gtk

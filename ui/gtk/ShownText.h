@@ -20,4 +20,7 @@ void showText(GtkLabel* label, std::string_view text);
 /// Gives a widget without a text a name, for screen readers and as a tooltip.
 void nameWidget(GtkWidget* widget, const char* name);
 
+/// Whether anybody can see it: it is on a page that is shown, of a window that is not minimized.
+bool isSeen(GtkWidget* widget);
+
 } // namespace pallax::gtk

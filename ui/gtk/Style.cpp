@@ -6,8 +6,10 @@ namespace pallax::gtk {
 
 namespace {
 
-/// The layouts have their own margins: the theme's would add to them.
+/// The layouts have their own margins: the theme's would add to them. Rows change at each tick: the
+/// theme's transitions would draw a dozen frames each time.
 constexpr const char* kStyle = R"(
+row { transition: none; }
 .pallax-rows { background: none; }
 .pallax-rows > row { padding: 0; margin: 0; border-radius: 0; }
 .pallax-rows label { padding: 0; }

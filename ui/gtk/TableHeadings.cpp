@@ -24,8 +24,7 @@ GtkWidget* buildContent(const ColumnPlan::Place& place, const char* icon,
         text += (text.empty() ? "" : "\n") + shownText(line);
     }
     GtkWidget* label = gtk_label_new(text.c_str());
-    const auto attributes = metrics.attributes(icon != nullptr ? kChangedFont : kCellFont);
-    gtk_label_set_attributes(GTK_LABEL(label), attributes.get());
+    metrics.setFont(GTK_LABEL(label), icon != nullptr ? kChangedFont : kCellFont);
     gtk_label_set_xalign(GTK_LABEL(label), place.isRight ? 1 : 0);
     gtk_label_set_justify(GTK_LABEL(label), place.isRight ? GTK_JUSTIFY_RIGHT : GTK_JUSTIFY_LEFT);
     gtk_label_set_ellipsize(GTK_LABEL(label), PANGO_ELLIPSIZE_END);

@@ -100,8 +100,7 @@ void TableView::fillCell(GtkLabel* label, std::size_t row, std::size_t column) c
     const TableCell& cell = _model.content().rows[row].cells[column];
     const std::string text = shownText(cell.text) + (cell.opens ? " ›" : "");
     const bool hasChanged = _model.hasChanged(row, column);
-    const auto attributes = _metrics.attributes(hasChanged ? kChangedFont : kCellFont);
-    gtk_label_set_attributes(label, attributes.get());
+    _metrics.setFont(label, hasChanged ? kChangedFont : kCellFont);
     gtk_label_set_text(label, text.c_str());
     setClass(GTK_WIDGET(label), "pallax-changed", hasChanged);
 }

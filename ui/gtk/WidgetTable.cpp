@@ -206,7 +206,7 @@ void WidgetTable::reloadData() {
     }
     showPlaceholder();
     refreshTable();
-    if (gtk_widget_get_mapped(GTK_WIDGET(_list)) == 0) {
+    if (!isSeen(GTK_WIDGET(_list))) {
         for (auto& [item, bound] : _bound) { // filled when it is seen
             bound.isStale = true;
         }

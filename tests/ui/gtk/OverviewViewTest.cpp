@@ -105,5 +105,34 @@ TEST_F(OverviewViewTest, RowsStayWhenOnlyTheirTextsChange) {
               nullptr);
 }
 
+TEST_F(OverviewViewTest, RowsAndGroupsThatAreNotNeededNowAreHiddenUntilTheyAre) {
+    OverviewView view;
+    const Overview before = overview();
+    view.show(before);
+    WindowStage stage(1024, 768);
+    stage.frame.setDetail(view.widget(), "Overview");
+    stage.settle();
+    const std::string dump = stage.dump();
+    GtkWidget* row = WindowStage::below(view.widget(), ADW_TYPE_ACTION_ROW);
+
+    Overview fewer = before;
+    fewer.status.neighbours.clear(); // the contexts come in their place
+    fewer.events.pop_back();
+    view.show(fewer);
+    stage.settle();
+    const std::string fewerDump = stage.dump();
+    EXPECT_EQ(fewerDump.find("text: Neighbours"), std::string::npos) << fewerDump;
+    EXPECT_EQ(fewerDump.find("182 → 183"), std::string::npos) << fewerDump;
+    EXPECT_NE(fewerDump.find("text: Contexts\ntext: ims\ntext: Active\ntext: Events\n"
+                             "text: serving cell 150 → 182 after 58 s\ntext: 01:00:10\n"),
+              std::string::npos)
+        << fewerDump;
+
+    view.show(before);
+    stage.settle();
+    EXPECT_EQ(stage.dump(), dump);
+    EXPECT_EQ(WindowStage::below(view.widget(), ADW_TYPE_ACTION_ROW), row);
+}
+
 } // namespace
 } // namespace pallax::gtk

@@ -1,6 +1,8 @@
 #include "tests/ui/gtk/WindowStage.h"
 #include "tests/ui/gtk/XDisplay.h"
+#include "ui/gtk/ShownText.h"
 
+#include <gdk/x11/gdkx.h>
 #include <string>
 
 namespace pallax::gtk {
@@ -40,6 +42,28 @@ protected:
         })));
     }
 };
+
+TEST_F(WidgetTableRows, AMinimizedWindowIsFilledWhenItIsSeenAgain) {
+    WindowStage stage(360, 640);
+    stage.tick(rows(3, "before"));
+    GdkSurface* surface = gtk_native_get_surface(GTK_NATIVE(stage.window()));
+    Display* server = gdk_x11_display_get_xdisplay(gdk_display_get_default());
+    const auto awaitSeen = [&](bool isWanted) {
+        while (isSeen(stage.table().widget()) != isWanted) {
+            (void)g_main_context_iteration(nullptr, TRUE);
+        }
+    };
+    XUnmapWindow(server, gdk_x11_surface_get_xid(surface)); // as a window manager does
+    awaitSeen(false);
+    stage.give(rows(3, "after"));
+    EXPECT_NE(stage.dump().find("| before"), std::string::npos) << stage.dump();
+    EXPECT_EQ(stage.dump().find("| after"), std::string::npos) << stage.dump();
+
+    XMapWindow(server, gdk_x11_surface_get_xid(surface));
+    awaitSeen(true);
+    EXPECT_NE(stage.dump().find("| after"), std::string::npos) << stage.dump();
+    EXPECT_EQ(stage.dump().find("| before"), std::string::npos) << stage.dump();
+}
 
 TEST_F(WidgetTableRows, ThePlaceInTheListStaysAcrossTicks) {
     WindowStage stage(360, 400);

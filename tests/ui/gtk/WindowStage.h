@@ -50,6 +50,11 @@ public:
 
     /// Shows new data, as the application does.
     void tick(const PropertyList& display) {
+        give(display);
+        settle();
+    }
+    /// The same, without waiting for a frame.
+    void give(const PropertyList& display) {
         PathDictionary paths;
         const NodeRef root = PallaxModelNode::makeTreeFromObject(display, paths);
         _isConnected = root != nullptr;
@@ -64,7 +69,6 @@ public:
             pane.reloadWithNode(index == 0 ? root : found->second);
         }
         showStatus(*_stack->screens().back());
-        settle();
     }
 
     /// Lets the toolkit draw, and everything that follows from it happen: some frames.
