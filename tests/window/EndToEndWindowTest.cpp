@@ -50,7 +50,7 @@ TEST_F(EndToEndWindow, EventsHitsAndAnswersAreTablesThatGoToTheirInstant) {
               "has 'Nothing in this instant contains this text.' "
               "press 'Whole Recording' has 'Time 22:13:53, Name context-down*' "
               "key Escape lacks 'Whole Recording' press 'To the present' "
-              "open 'SIM Info'"));
+              "lacks '*, held*' open 'SIM Info'"));
 }
 
 TEST_F(EndToEndWindow, AListIsATableWithColumns) {

@@ -136,7 +136,7 @@ def walk_to(item):
             return
         press_key("Down" if at is None or at < wanted else "Up")
         time.sleep(0.1)
-    sys.exit("cannot go to the row\n" + tree())
+    sys.exit("cannot go to the row " + (item.get_name() or "") + "\n" + tree())
 
 
 def field(name):

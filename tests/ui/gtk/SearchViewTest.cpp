@@ -55,7 +55,7 @@ TEST_F(SearchViewTest, BeginsWithAnEmptyField) {
 button: Back
 title: Find a Text / 
 field: ""
-button: This Instant
+button: This Instant (on)
 button: Whole Recording
 text: Type a part of a name or a value.
 )");
@@ -68,7 +68,7 @@ TEST_F(SearchViewTest, RowsOfTheInstantThatContainTheTextAreListed) {
 button: Back
 title: Find a Text / 
 field: "7"
-button: This Instant
+button: This Instant (on)
 button: Whole Recording
 columns: Name | Value | Where
 cells (cursor): PCI | 7 | Cells, PCI 7
