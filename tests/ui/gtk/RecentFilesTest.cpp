@@ -83,8 +83,8 @@ TEST_F(RecentFilesTest, ThoseOfOtherApplicationsAreNotOfferedAndStay) {
     std::string type = "text/plain";
     std::string application = "Letters";
     std::string program = "letters";
-    const GtkRecentData data{nullptr, nullptr, type.data(), application.data(), program.data(),
-                             nullptr, FALSE};
+    const GtkRecentData data{nullptr,        nullptr, type.data(), application.data(),
+                             program.data(), nullptr, FALSE};
     ASSERT_TRUE(gtk_recent_manager_add_full(manager.get(), other.c_str(), &data));
     files->add(file("drive.pcap"));
     await(1);
