@@ -1,7 +1,7 @@
 #include "ui/terminal/FrontEnd.h"
 
-#include "ui/pages/EventText.h"
 #include "ui/contents/TravelWords.h"
+#include "ui/pages/EventText.h"
 #include "ui/pages/Overlays.h"
 #include "ui/terminal/ModalKeys.h"
 #include "ui/terminal/PaneView.h"
