@@ -60,12 +60,12 @@ AnswerRows::Kind AnswerRows::kindOf(std::string_view type) {
     return type.starts_with("Float") || type.starts_with("Decimal") ? Kind::Real : Kind::Text;
 }
 
-std::int64_t integerOf(const QueryValue& cell) {
+std::int64_t integerIn(const QueryValue& cell) {
     const auto* integer = std::get_if<std::int64_t>(&cell);
     return integer != nullptr ? *integer : 0;
 }
 
-std::string textOf(const QueryValue& cell) {
+std::string textIn(const QueryValue& cell) {
     const auto* text = std::get_if<std::string>(&cell);
     return text != nullptr ? *text : std::string();
 }

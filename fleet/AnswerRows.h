@@ -18,9 +18,9 @@ public:
 };
 
 /// The number in a cell; 0 if there is none.
-std::int64_t integerOf(const QueryValue& cell);
+std::int64_t integerIn(const QueryValue& cell);
 /// The text in a cell; empty if there is none.
-std::string textOf(const QueryValue& cell);
+std::string textIn(const QueryValue& cell);
 
 /// Reads an answer of ClickHouse in the format TabSeparatedWithNamesAndTypes, in pieces of any
 /// size. Integers and real numbers become numbers, NULL and NaN become NULL, everything else a

@@ -34,20 +34,20 @@ enum Column : std::size_t {
 /// `first` is the beginning of the value's recording.
 StoredValue valueOf(const Row& row, std::int64_t first) {
     StoredValue value;
-    if (std::string entry = textOf(row[kEntry]); !entry.empty()) {
+    if (std::string entry = textIn(row[kEntry]); !entry.empty()) {
         value.entry = std::move(entry);
     }
-    value.start = integerOf(row[kSince]) - first;
-    value.end = value.start + integerOf(row[kHeld]);
-    value.packet = static_cast<std::uint64_t>(integerOf(row[kPacket]));
+    value.start = integerIn(row[kSince]) - first;
+    value.end = value.start + integerIn(row[kHeld]);
+    value.packet = static_cast<std::uint64_t>(integerIn(row[kPacket]));
     if (const auto* real = std::get_if<double>(&row[kNumber])) {
         value.number = *real;
     }
-    const auto decimals = integerOf(row[kDecimals]);
+    const auto decimals = integerIn(row[kDecimals]);
     value.text =
         decimals < 0 || !value.number
-            ? textOf(row[kText])
-            : decimalText(*value.number, static_cast<std::size_t>(decimals)) + textOf(row[kSuffix]);
+            ? textIn(row[kText])
+            : decimalText(*value.number, static_cast<std::size_t>(decimals)) + textIn(row[kSuffix]);
     if (const auto* raw = std::get_if<std::int64_t>(&row[kRaw])) {
         value.raw = *raw;
     }
@@ -68,7 +68,7 @@ std::vector<std::string> ServerRecordings::devices() {
     std::vector<std::string> devices;
     for (const Row& row :
          _store.server().rows("SELECT DISTINCT device FROM recordings ORDER BY device", 1)) {
-        devices.push_back(textOf(row.front()));
+        devices.push_back(textIn(row.front()));
     }
     return devices;
 }
@@ -97,7 +97,7 @@ void ServerRecordings::values(const LoadedRecording& recording,
         "AND field IN (%@) ORDER BY packet, since",
         {fromRowsOf(recording, "intervals"), listed(fields)});
     _store.server().eachRow(query, kColumns, [&](const Row& row) {
-        const auto field = std::find(fields.begin(), fields.end(), textOf(row[kField]));
+        const auto field = std::find(fields.begin(), fields.end(), textIn(row[kField]));
         if (field != fields.end()) {
             take(static_cast<std::size_t>(field - fields.begin()), valueOf(row, recording.first));
         }
@@ -110,7 +110,7 @@ std::vector<Event> ServerRecordings::events(const LoadedRecording& recording) {
              formatText("SELECT time, packet, kind, words %@", {fromRowsOf(recording, "events")}),
              4)) {
         if (auto event =
-                storedEvent(integerOf(row[0]), integerOf(row[1]), textOf(row[2]), textOf(row[3]))) {
+                storedEvent(integerIn(row[0]), integerIn(row[1]), textIn(row[2]), textIn(row[3]))) {
             events.push_back(*std::move(event));
         }
     }

@@ -33,17 +33,17 @@ constexpr std::size_t kPiece = std::size_t{1} << 20U;
 LoadedRecording recordingOf(const std::vector<QueryValue>& row) {
     LoadedRecording recording;
     auto cell = row.begin();
-    recording.id = static_cast<std::uint64_t>(integerOf(*cell));
+    recording.id = static_cast<std::uint64_t>(integerIn(*cell));
     std::advance(cell, 2); // gone
     for (std::string* text :
          {&recording.device, &recording.name, &recording.digest, &recording.beginnings,
           &recording.technology, &recording.decoder, &recording.every, &recording.identities}) {
-        *text = textOf(*cell++);
+        *text = textIn(*cell++);
     }
     for (std::int64_t* number : {&recording.packets, &recording.first, &recording.last}) {
-        *number = integerOf(*cell++);
+        *number = integerIn(*cell++);
     }
-    if (const std::string trouble = textOf(*cell); !trouble.empty()) {
+    if (const std::string trouble = textIn(*cell); !trouble.empty()) {
         recording.trouble = trouble;
     }
     return recording;
@@ -92,7 +92,7 @@ std::string joined(const std::vector<std::string>& names) {
 ServerStore::ServerStore(const StoreAddress& address, Patience patience)
     : _patience(patience), _server(address, patience) {
     const auto rows = _server.rows("SELECT version, cluster, copies FROM store", 3);
-    const std::int64_t version = rows.size() == 1 ? integerOf(rows.front()[0]) : 0;
+    const std::int64_t version = rows.size() == 1 ? integerIn(rows.front()[0]) : 0;
     if (version > kServerStoreVersion) {
         throw StoreFailure(formatText("%@ is a store of a later version of Pallax: its tables have "
                                       "version %lld, and this program knows version %u.",
@@ -101,8 +101,8 @@ ServerStore::ServerStore(const StoreAddress& address, Patience patience)
     if (version != kServerStoreVersion) {
         throw StoreFailure(formatText("%@ has other tables than a store.", {address.text()}));
     }
-    _isSharded = !textOf(rows.front()[1]).empty();
-    _copies = integerOf(rows.front()[2]);
+    _isSharded = !textIn(rows.front()[1]).empty();
+    _copies = integerIn(rows.front()[2]);
 }
 
 std::string ServerStore::table(const std::string& name) const {
@@ -121,7 +121,7 @@ std::vector<LoadedRecording> ServerStore::loads(const std::string& condition,
                                  "%@",
                                  {kLoadColumns, table("loads"), condition, by}),
                       kLoadColumnCount)) {
-        if (integerOf(row[1]) == 0) {
+        if (integerIn(row[1]) == 0) {
             recordings.push_back(recordingOf(row));
         }
     }
@@ -244,7 +244,7 @@ void ServerStore::addFields(const RecordingMeasurements& measurements) {
     std::map<std::string, std::string> known; // the digest that the store has for each name
     for (const auto& row : _server.rows(
              "SELECT name, argMax(content, load) FROM " + table("fields") + " GROUP BY name", 2)) {
-        known.emplace(textOf(row[0]), textOf(row[1]));
+        known.emplace(textIn(row[0]), textIn(row[1]));
     }
     RowBinary rows;
     for (FieldIndex index = 0; index < measurements.fields().size(); ++index) {
@@ -283,7 +283,7 @@ std::int64_t ServerStore::rowsOfCopies() {
     for (const std::string& of :
          {formatText("intervals_everywhere WHERE field IN (%@)", {fields}),
           std::string("events_everywhere WHERE 1"), std::string("cells_everywhere WHERE 1")}) {
-        rows += integerOf(
+        rows += integerIn(
             _server.rows(formatText("SELECT count() FROM %@ AND %@", {of, own}), 1).at(0)[0]);
     }
     return rows;

@@ -68,14 +68,14 @@ WindowSession::~WindowSession() {
 
 ViewerSession::Face WindowSession::face() {
     return {.message = [this](const auto& text) { _frame.setMessage(text); },
-            .note = [this](const auto& text) { _frame.setNote(text); },
+            .note = [this](const auto& text) { _frame.remarks().setNote(text); },
             .origin = [this](const auto& technology,
                              const auto& name) { _frame.setOrigin(technology, name); },
             .oldValues = [this](const auto& time) { _frame.setOldValues(time); },
-            .stream = [this](const auto& state) { _frame.setStream(state); },
+            .stream = [this](const auto& state) { _frame.remarks().setStream(state); },
             .alarms =
                 [this](const auto& names) {
-                    _frame.setAlarms(names);
+                    _frame.remarks().setAlarms(names);
                     tick();
                 },
             .alarmBegan = [this](const AlarmRule& rule) { _notify(rule.name); },

@@ -1,5 +1,6 @@
 #include "ui/gtk/MainFrame.h"
 
+#include "ui/gtk/EndedPage.h"
 #include "ui/gtk/SaveScreen.h"
 #include "ui/gtk/ShownText.h"
 #include "ui/gtk/Style.h"
@@ -43,7 +44,6 @@ MainFrame::MainFrame(GtkApplication* application, const Guard& guard, Actions ac
       _bars(GTK_BOX(gtk_box_new(GTK_ORIENTATION_VERTICAL, 0))),
       _toolbar(GTK_BOX(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, 8))),
       _spinner(GTK_SPINNER(gtk_spinner_new())), _status(GTK_LABEL(gtk_label_new(nullptr))),
-      _remarks(GTK_LABEL(gtk_label_new(nullptr))),
       _save(GTK_BUTTON(gtk_button_new_with_label(translated("Save")))) {
     addStyle();
     build();
@@ -95,15 +95,10 @@ GtkWidget* MainFrame::buildToolbar() {
     GtkWidget* texts = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
     gtk_widget_set_hexpand(texts, TRUE);
     gtk_widget_set_valign(texts, GTK_ALIGN_CENTER);
-    for (GtkLabel* label : {_status, _remarks}) {
-        gtk_label_set_ellipsize(label, PANGO_ELLIPSIZE_END);
-        gtk_label_set_xalign(label, 0);
-        gtk_box_append(GTK_BOX(texts), GTK_WIDGET(label));
-    }
-    for (const char* look : {"dim-label", "caption"}) {
-        gtk_widget_add_css_class(GTK_WIDGET(_remarks), look);
-    }
-    showText(_remarks, "");
+    gtk_label_set_ellipsize(_status, PANGO_ELLIPSIZE_END);
+    gtk_label_set_xalign(_status, 0);
+    gtk_box_append(GTK_BOX(texts), GTK_WIDGET(_status));
+    gtk_box_append(GTK_BOX(texts), _remarks.widget());
     for (GtkWidget* child : {GTK_WIDGET(_spinner), texts, GTK_WIDGET(_save)}) {
         gtk_box_append(_toolbar, child);
     }
@@ -351,39 +346,6 @@ void MainFrame::setMessage(const std::string& text) {
     adw_toast_overlay_add_toast(_toasts, _message.get());
 }
 
-void MainFrame::setNote(std::string text) {
-    _note = std::move(text);
-    showRemarks();
-}
-
-void MainFrame::setStream(std::string state) {
-    _stream = std::move(state);
-    showRemarks();
-}
-
-void MainFrame::setAlarms(const std::vector<std::string>& names) {
-    _alarms.clear();
-    for (const std::string& alarm : names) {
-        _alarms += (_alarms.empty() ? translated("alarm: ") : ", ") + alarm;
-    }
-    showRemarks();
-}
-
-void MainFrame::showRemarks() {
-    std::string text;
-    for (const std::string* part : {&_alarms, &_stream, &_note}) {
-        if (!part->empty()) {
-            text += (text.empty() ? "" : " · ") + *part;
-        }
-    }
-    if (text == std::exchange(_shownRemarks, text)) {
-        return;
-    }
-    showText(_remarks, text);
-    gtk_widget_set_tooltip_text(GTK_WIDGET(_remarks),
-                                text.empty() ? nullptr : shownText(text).c_str());
-}
-
 void MainFrame::setOrigin(const std::string& technology, const std::string& source) {
     const std::string text = technology.empty() ? source : technology + " · " + source;
     adw_window_title_set_subtitle(_title, shownText(text).c_str());
@@ -395,22 +357,10 @@ void MainFrame::setOldValues(const std::string& time) {
 }
 
 void MainFrame::showEnded(const std::string& sentence) {
-    GtkWidget* page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
-    gtk_box_append(GTK_BOX(page), adw_header_bar_new());
-    GtkWidget* status = adw_status_page_new();
-    adw_status_page_set_icon_name(ADW_STATUS_PAGE(status), "dialog-error-symbolic");
-    adw_status_page_set_title(ADW_STATUS_PAGE(status), translated("Pallax has stopped"));
-    adw_status_page_set_description(ADW_STATUS_PAGE(status), shownMarkup(sentence).c_str());
-    GtkWidget* close = gtk_button_new_with_label(translated("Close"));
-    gtk_widget_add_css_class(close, "pill");
-    gtk_widget_set_halign(close, GTK_ALIGN_CENTER);
-    onSignal(close, "clicked", _guard, [this] { _guard.queue().async(_actions.closed); });
-    adw_status_page_set_child(ADW_STATUS_PAGE(status), close);
-    gtk_widget_set_vexpand(status, TRUE);
-    gtk_box_append(GTK_BOX(page), status);
-    gtk_stack_add_named(_pages, page, kEndedPage);
+    const EndedPage page = endedPage(sentence, _guard, _actions.closed);
+    gtk_stack_add_named(_pages, page.widget, kEndedPage);
     gtk_stack_set_visible_child_name(_pages, kEndedPage);
-    gtk_widget_grab_focus(close);
+    gtk_widget_grab_focus(page.button);
 }
 
 void MainFrame::back() {

@@ -5,6 +5,7 @@
 #include "ui/gtk/FilterBar.h"
 #include "ui/gtk/PangoMetrics.h"
 #include "ui/gtk/Ref.h"
+#include "ui/gtk/Remarks.h"
 #include "ui/gtk/Signals.h"
 #include "ui/gtk/WidgetNavigation.h"
 #include "ui/gtk/WorkCover.h"
@@ -49,9 +50,7 @@ public:
 
     /// Shows an event that has just happened, for some seconds or until the next one.
     void setMessage(const std::string& text);
-    void setNote(std::string text);
-    void setStream(std::string state);
-    void setAlarms(const std::vector<std::string>& names);
+    Remarks& remarks() { return _remarks; }
     void setOrigin(const std::string& technology, const std::string& source);
     /// The values are from before this time; "": they are current.
     void setOldValues(const std::string& time);
@@ -106,7 +105,6 @@ private:
     void adopt(WidgetNavigation* stack);
     void showToolbarItems(const ui::BarItems& items);
     void reloadTables();
-    void showRemarks();
     void showListButton();
     void back();
     gboolean handleKey(guint key, guint code, GdkModifierType state);
@@ -134,7 +132,6 @@ private:
     GtkBox* _toolbar;
     GtkSpinner* _spinner;
     GtkLabel* _status;
-    GtkLabel* _remarks;
     GtkButton* _save;
     GtkWidget* _modal = nullptr;
     GtkWidget* _page = nullptr;
@@ -144,10 +141,7 @@ private:
     Ref<GtkWidget> _detail; ///< beside the root pane
     std::string _detailTitle;
     std::function<void()> _saveAction = [] {};
-    std::string _note;
-    std::string _stream;
-    std::string _alarms;
-    std::string _shownRemarks;
+    Remarks _remarks;
     std::vector<std::pair<gpointer, gulong>> _handlers;
 };
 

@@ -13,9 +13,9 @@ class MainFrameTest : public DisplayTest {};
 TEST_F(MainFrameTest, TellsTheOriginTheRemarksAndOldValues) {
     WindowStage stage(360, 720);
     stage.frame.setOrigin("Zorell_LTE", "drive <1>.pcap");
-    stage.frame.setNote("End of the recording");
-    stage.frame.setStream("no data for 7 s");
-    stage.frame.setAlarms({"weak", "gone"});
+    stage.frame.remarks().setNote("End of the recording");
+    stage.frame.remarks().setStream("no data for 7 s");
+    stage.frame.remarks().setAlarms({"weak", "gone"});
     stage.frame.setOldValues("22:13:30");
     stage.tick(Dictionary{});
     EXPECT_EQ(stage.dump(), R"(
@@ -26,9 +26,9 @@ text: alarm: weak, gone · no data for 7 s · End of the recording
 button: Save
 )");
     stage.frame.setOldValues("");
-    stage.frame.setNote("");
-    stage.frame.setStream("");
-    stage.frame.setAlarms({});
+    stage.frame.remarks().setNote("");
+    stage.frame.remarks().setStream("");
+    stage.frame.remarks().setAlarms({});
     stage.frame.setOrigin("", "live modem");
     stage.settle();
     EXPECT_EQ(stage.dump(), R"(
@@ -96,7 +96,7 @@ TEST_F(MainFrameTest, FitsAPhoneWithLargeTexts) {
     g_object_set(settings, "gtk-xft-dpi", kTwice, nullptr);
     WindowStage stage(360, 720);
     stage.tick(terminal::display());
-    stage.frame.setNote("End of the recording");
+    stage.frame.remarks().setNote("End of the recording");
     stage.select(0);
     EXPECT_LE(gtk_widget_get_width(stage.window()), 360);
     g_object_set(settings, "gtk-xft-dpi", usual, nullptr);
