@@ -13,7 +13,8 @@ FilterBar::FilterBar(const Guard& guard, std::function<void(const std::string& t
     gtk_search_bar_connect_entry(_bar.get(), GTK_EDITABLE(_field));
     gtk_widget_set_hexpand(GTK_WIDGET(_field), TRUE);
     nameWidget(GTK_WIDGET(_field), translated("Show rows that contain a text"));
-    onSignal(_field, "search-changed", guard,
+    // At once: "search-changed" comes later, when another pane may be open.
+    onSignal(_field, "changed", guard,
              [field = _field, filter] { filter(gtk_editable_get_text(GTK_EDITABLE(field))); });
     onSignal(_bar.get(), "notify::search-mode-enabled", guard,
              [bar = _bar.get(), field = _field, filter] {
