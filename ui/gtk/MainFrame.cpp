@@ -16,6 +16,7 @@ namespace {
 
 constexpr int kUsualWidth = 1000;
 constexpr int kUsualHeight = 700;
+constexpr int kMessageWidth = 28; // characters of a line: what a phone has room for
 constexpr int kLeastWidth = 320;
 constexpr int kLeastHeight = 240;
 constexpr const char* kPanesPage = "panes";
@@ -341,6 +342,7 @@ void MainFrame::setMessage(const std::string& text) {
     _message = shared(adw_toast_new(""));
     GtkWidget* label = gtk_label_new(shownText(text).c_str());
     gtk_label_set_wrap(GTK_LABEL(label), TRUE); // a title would be cut on a phone
+    gtk_label_set_max_width_chars(GTK_LABEL(label), kMessageWidth);
     gtk_widget_add_css_class(label, "heading");
     adw_toast_set_custom_title(_message.get(), label);
     adw_toast_overlay_add_toast(_toasts, _message.get());

@@ -93,6 +93,7 @@ void RecentFiles::add(const std::string& path) {
                              .groups = nullptr,
                              .is_private = TRUE};
     (void)gtk_recent_manager_add_full(_manager, taken(g_file_get_uri(file.get())).c_str(), &data);
+    writeNow();
 }
 
 void RecentFiles::clear() {
@@ -101,6 +102,12 @@ void RecentFiles::clear() {
     for (const std::string& address : addresses) {
         (void)gtk_recent_manager_remove_item(_manager, address.c_str(), nullptr);
     }
+    writeNow();
+}
+
+/// The manager would write its list a little later, when the program may have ended.
+void RecentFiles::writeNow() {
+    g_signal_emit_by_name(_manager, "changed");
 }
 
 std::vector<std::string> RecentFiles::paths() const {

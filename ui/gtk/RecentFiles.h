@@ -38,6 +38,7 @@ public:
 private:
     template <class Action>
     void forEach(const Action& action) const;
+    void writeNow();
     void refresh();
 
     Guard _guard;

@@ -58,6 +58,15 @@ TEST_F(RecentFilesTest, ThoseThatWereShownAreOfferedAndOpened) {
     EXPECT_EQ(opened, std::vector<std::string>{path});
 }
 
+TEST_F(RecentFilesTest, AreWrittenAndClearedAtOnce) {
+    const auto written = [this] { return doubles::contentOf(folder.path("list.xbel")); };
+    files->add(file("drive.pcap"));
+    EXPECT_NE(written().find("drive.pcap"), std::string::npos);
+    ASSERT_TRUE(gtk_widget_activate_action(stage->window(), "recent.clear", nullptr));
+    EXPECT_EQ(written().find("drive.pcap"), std::string::npos);
+    EXPECT_EQ(entries(), 0);
+}
+
 TEST_F(RecentFilesTest, OtherApplicationsDoNotOfferThem) {
     files->add(file("drive.pcap"));
     await(1);
