@@ -342,6 +342,7 @@ void MainFrame::setMessage(const std::string& text) {
     _message = shared(adw_toast_new(""));
     GtkWidget* label = gtk_label_new(shownText(text).c_str());
     gtk_label_set_wrap(GTK_LABEL(label), TRUE); // a title would be cut on a phone
+    gtk_label_set_wrap_mode(GTK_LABEL(label), PANGO_WRAP_WORD_CHAR); // a file's name has no spaces
     gtk_label_set_max_width_chars(GTK_LABEL(label), kMessageWidth);
     gtk_widget_add_css_class(label, "heading");
     adw_toast_set_custom_title(_message.get(), label);
