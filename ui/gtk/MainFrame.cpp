@@ -16,7 +16,8 @@ namespace {
 
 constexpr int kUsualWidth = 1000;
 constexpr int kUsualHeight = 700;
-constexpr int kMessageWidth = 28; // characters of a line: what a phone has room for
+constexpr int kMessageWidth = 28;    // characters of a line: what a phone has room for
+constexpr guint kMessageSeconds = 3; // it covers the time bar
 constexpr int kLeastWidth = 320;
 constexpr int kLeastHeight = 240;
 constexpr const char* kPanesPage = "panes";
@@ -340,6 +341,7 @@ void MainFrame::setMessage(const std::string& text) {
         adw_toast_dismiss(_message.get()); // it would be shown for its time before the next one
     }
     _message = shared(adw_toast_new(""));
+    adw_toast_set_timeout(_message.get(), kMessageSeconds);
     GtkWidget* label = gtk_label_new(shownText(text).c_str());
     gtk_label_set_wrap(GTK_LABEL(label), TRUE); // a title would be cut on a phone
     gtk_label_set_wrap_mode(GTK_LABEL(label), PANGO_WRAP_WORD_CHAR); // a file's name has no spaces

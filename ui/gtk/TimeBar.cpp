@@ -27,13 +27,12 @@ TimeBar::TimeBar(const Guard& guard, Actions actions)
             _actions.toShare(gtk_range_get_value(GTK_RANGE(_scale)));
         }
     });
+    gtk_label_set_ellipsize(_words, PANGO_ELLIPSIZE_END);
+    gtk_box_append(_box.get(), GTK_WIDGET(_words)); // beside the buttons is no room on a phone
     gtk_box_append(_box.get(), GTK_WIDGET(_scale));
     auto* buttons = GTK_BOX(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, kGap));
     buildButtons(buttons);
-    gtk_label_set_ellipsize(_words, PANGO_ELLIPSIZE_END);
-    gtk_label_set_xalign(_words, 0);
-    gtk_widget_set_hexpand(GTK_WIDGET(_words), TRUE);
-    gtk_box_append(buttons, GTK_WIDGET(_words));
+    gtk_widget_set_halign(GTK_WIDGET(buttons), GTK_ALIGN_CENTER);
     gtk_box_append(_box.get(), GTK_WIDGET(buttons));
     buildPlace();
 }

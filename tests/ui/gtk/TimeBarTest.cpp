@@ -21,6 +21,7 @@ TEST_F(TimeBarTest, ShowsWhereTimeIsHeldAndTellsWhatTheUserWants) {
     bar.show({.words = "held, 12 s behind", .clock = "22:14:06", .share = 0.25, .events = {0.5}});
     stage.settle();
     EXPECT_NE(stage.dump().find(R"(
+text: 22:14:06, held, 12 s behind
 scale: 25 %
 button: Event before
 button: Tick before
@@ -28,7 +29,6 @@ button: Play
 button: Next tick
 button: Next event
 button: To the present
-text: 22:14:06, held, 12 s behind
 field: ""
 button: Mark
 button: Changes since the Mark (off)
