@@ -24,7 +24,7 @@ import gi
 gi.require_version("Atspi", "2.0")
 from gi.repository import Atspi  # noqa: E402
 
-PATIENCE = 30
+PATIENCE = 30  # seconds
 KEYS = {"space": 0x20, "Tab": 0xFF09, "Up": 0xFF52, "Return": 0xFF0D, "Escape": 0xFF1B, "Right": 0xFF53, "Left": 0xFF51, "Down": 0xFF54, "Home": 0xFF50, "End": 0xFF57}
 
 
