@@ -58,7 +58,7 @@ TEST_F(EndToEndWindow, AListIsATableWithColumns) {
         drive(sample("lte-drive.pcap") + " --speed max",
               "has 'Updated 2023-11-14 at 22:15:20' open 'Neighbor Cells List, 2' "
               "press 'Show as Table' has 'Physical Cell ID 184, Measured RSSI -64.00 dBm*' "
-              "press 'Measured RSRP dBm' "
+              "press 'Measured RSRP dBm' has 'Measured RSRP dBm, sorted, *' "
               "open 'Physical Cell ID 285, *' has 'Physical Cell ID: 285' key Escape "
               "press 'Show as Rows' lacks 'Physical Cell ID 184, *'"));
 }

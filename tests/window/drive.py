@@ -116,27 +116,29 @@ def has_focus(node):
     return node.get_state_set().contains(Atspi.StateType.FOCUSED)
 
 
-def walk_to(item):
-    """Goes to a row of a list by Tab and the arrows, as a user without a mouse does."""
-    while item.get_role() != Atspi.Role.LIST_ITEM:
-        item = item.get_parent()
+def row_of(name):
+    """The row with this name, or the one that has something of this name in it."""
+    node = find(name)
+    while node is not None and node.get_role() != Atspi.Role.LIST_ITEM:
+        node = node.get_parent()
+    return node
 
-    def rows():
-        return [each for each in children(item.get_parent())]
 
-    for _ in range(30):
-        if any(has_focus(each) for each in rows()):
-            break
-        press_key("Tab")
-        time.sleep(0.1)
-    wanted = item.get_index_in_parent()
-    for _ in range(60):
-        at = next((each.get_index_in_parent() for each in rows() if has_focus(each)), None)
+def walk_to(name):
+    """Goes to a row of a list by Tab and the arrows, as a user without a mouse does.
+
+    Where the row is is asked again before every key: a list may be sorted meanwhile.
+    """
+    for _ in range(90):
+        item = await_result(lambda: row_of(name), "no row " + name)
+        rows = children(item.get_parent())
+        at = next((index for index, row in enumerate(rows) if has_focus(row)), None)
+        wanted = item.get_index_in_parent()
         if at == wanted:
             return
-        press_key("Down" if at is None or at < wanted else "Up")
+        press_key("Tab" if at is None else "Down" if at < wanted else "Up")
         time.sleep(0.1)
-    sys.exit("cannot go to the row " + (item.get_name() or "") + "\n" + tree())
+    sys.exit("cannot go to the row " + name + "\n" + tree())
 
 
 def field(name):
@@ -160,8 +162,7 @@ def step(verb, argument):
         )
         button.get_action_iface().do_action(0)
     elif verb == "open":
-        row = await_result(lambda: find(argument), "no row " + argument)
-        walk_to(row)
+        walk_to(argument)
         press_key("Return")
     elif verb == "menu":
         step("press", "Menu")
@@ -172,7 +173,7 @@ def step(verb, argument):
     elif verb == "windows":
         await_result(lambda: len(list(windows())) == int(argument), "not so many windows: " + argument)
     elif verb == "focus":
-        walk_to(await_result(lambda: find(argument), "no row " + argument))
+        walk_to(argument)
     elif verb == "key":
         press_key(argument)
     elif verb == "type":
