@@ -8,7 +8,7 @@ namespace pallax {
 
 namespace {
 
-constexpr std::chrono::milliseconds kStateInterval{250};
+constexpr std::chrono::milliseconds kStateInterval{500};
 
 } // namespace
 

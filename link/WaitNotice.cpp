@@ -8,7 +8,7 @@ namespace pallax {
 
 namespace {
 
-constexpr std::chrono::milliseconds kLookInterval{250};
+constexpr std::chrono::milliseconds kLookInterval{500};
 
 } // namespace
 

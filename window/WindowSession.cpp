@@ -19,7 +19,7 @@ using Direction = Travel::Direction;
 constexpr std::chrono::milliseconds kPlayedFrame{200};
 constexpr std::chrono::minutes kLongStep{1};
 /// Short beside the two seconds of a tick. Without it, most of a window's cost is waking up.
-constexpr std::chrono::milliseconds kPacketPause{200};
+constexpr std::chrono::milliseconds kPacketPause{500};
 
 } // namespace
 

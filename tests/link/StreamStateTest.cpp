@@ -34,12 +34,12 @@ protected:
 TEST_F(StreamStateTest, ALiveChannelWithoutAPacketForThreeTicksHasNoData) {
     _queue.advance(6s);
     EXPECT_EQ(said(), "nothing");
-    _queue.advance(750ms);
+    _queue.advance(1s);
     EXPECT_EQ(said(), "no data for 6 s") << "since the connection was seen";
     _queue.advance(3min);
     EXPECT_EQ(said(), "no data for 3 min");
     packet();
-    _queue.advance(250ms);
+    _queue.advance(500ms);
     EXPECT_EQ(said(), "");
     const std::size_t count = _said.size();
     for (int second = 0; second < 60; ++second) {
@@ -63,15 +63,15 @@ TEST_F(StreamStateTest, WithoutAConnectionItSaysWhatIsWaitedFor) {
     _queue.advance(1ms);
     EXPECT_EQ(said(), "connecting: no service");
     _obstacle = "no answer";
-    _queue.advance(250ms);
+    _queue.advance(500ms);
     EXPECT_EQ(said(), "connecting: no answer");
     _isConnected = true;
-    _queue.advance(250ms);
+    _queue.advance(500ms);
     EXPECT_EQ(said(), "");
     _queue.advance(6s);
     EXPECT_EQ(said(), "") << "the silence begins with the connection";
     _isConnected = false;
-    _queue.advance(1250ms);
+    _queue.advance(1500ms);
     EXPECT_EQ(said(), "connecting: no answer");
 }
 

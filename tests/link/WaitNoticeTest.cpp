@@ -37,7 +37,7 @@ TEST_F(WaitNoticeTest, SaysOnceAfterASecondWhatIsWaitedFor) {
 TEST_F(WaitNoticeTest, RepeatsTheNoticeWhenTheReasonChanges) {
     _queue.advance(2s);
     _obstacle = "Busy";
-    _queue.advance(250ms);
+    _queue.advance(500ms);
     EXPECT_EQ(_said, (Texts{"No service; waiting", "Busy; waiting"}));
 }
 

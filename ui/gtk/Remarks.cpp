@@ -45,7 +45,7 @@ void Remarks::show() {
         return;
     }
     showText(_label.get(), text);
-    gtk_widget_set_tooltip_text(widget(), text.empty() ? nullptr : shownText(text).c_str());
+    showTooltip(widget(), text);
 }
 
 } // namespace pallax::gtk

@@ -134,8 +134,7 @@ void RowView::place(GtkLabel* label, const ui::Label& content, const ui::Rect& a
     const double room = area.origin.x + area.size.width - frame.origin.x;
     const bool isCut = area.size.width > 0 && frame.size.width > room;
     gtk_label_set_ellipsize(label, isCut ? PANGO_ELLIPSIZE_END : PANGO_ELLIPSIZE_NONE);
-    gtk_widget_set_tooltip_text(GTK_WIDGET(label),
-                                isCut ? shownText(content.text).c_str() : nullptr);
+    showTooltip(GTK_WIDGET(label), isCut ? std::string_view(content.text) : "");
     const double width = isCut ? std::max(room, 0.0) : frame.size.width;
     gtk_widget_set_size_request(GTK_WIDGET(label), static_cast<int>(std::lround(width * scale)),
                                 static_cast<int>(std::lround(frame.size.height * scale)));

@@ -27,6 +27,14 @@ void showText(GtkLabel* label, std::string_view text) {
     gtk_widget_set_visible(GTK_WIDGET(label), text.empty() ? FALSE : TRUE);
 }
 
+void showTooltip(GtkWidget* widget, std::string_view text) {
+    const std::string shown = shownText(text);
+    const char* const known = gtk_widget_get_tooltip_text(widget);
+    if (shown != (known == nullptr ? "" : known)) {
+        gtk_widget_set_tooltip_text(widget, shown.empty() ? nullptr : shown.c_str());
+    }
+}
+
 void nameWidget(GtkWidget* widget, const char* name) {
     gtk_widget_set_tooltip_text(widget, name);
     gtk_accessible_update_property(GTK_ACCESSIBLE(widget), GTK_ACCESSIBLE_PROPERTY_LABEL, name, -1);

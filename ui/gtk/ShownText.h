@@ -17,6 +17,10 @@ std::string shownMarkup(std::string_view text);
 /// Shows the text; a label without one is not seen.
 void showText(GtkLabel* label, std::string_view text);
 
+/// A tooltip, or none if the text is empty. One that stays is not set again: for that the toolkit
+/// would ask the X server where the pointer is, five times and waiting for each answer.
+void showTooltip(GtkWidget* widget, std::string_view text);
+
 /// Gives a widget without a text a name, for screen readers and as a tooltip.
 void nameWidget(GtkWidget* widget, const char* name);
 
