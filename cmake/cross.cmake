@@ -17,6 +17,8 @@ set(CMAKE_FIND_ROOT_PATH_MODE_PROGRAM NEVER)
 set(CMAKE_FIND_ROOT_PATH_MODE_LIBRARY ONLY)
 set(CMAKE_FIND_ROOT_PATH_MODE_INCLUDE ONLY)
 set(CMAKE_FIND_ROOT_PATH_MODE_PACKAGE ONLY)
+# Headers that differ by processor.
+set(CMAKE_CXX_STANDARD_INCLUDE_DIRECTORIES ${sysroot}/usr/include/${triplet})
 # Libraries that a library needs, for the linker.
 set(libraries ${sysroot}/usr/lib/${triplet} ${sysroot}/lib/${triplet})
 list(TRANSFORM libraries REPLACE "(.+)" "-L\\1 -Wl,-rpath-link,\\1" OUTPUT_VARIABLE links)
