@@ -1,5 +1,5 @@
-#include "host/Recording.h"
 #include "tests/window/EndToEndWindow.h"
+#include "tests/window/PacketsIn.h"
 
 #include <filesystem>
 
@@ -8,6 +8,7 @@ namespace {
 
 using doubles::CommandRun;
 using doubles::contentOf;
+using doubles::packetsIn;
 
 /// Recordings that the window makes.
 class EndToEndRecording : public EndToEndWindow {
@@ -18,15 +19,6 @@ protected:
         return "menu 'Record…' type 'Name:=" + path + "' press 'Record Record' ";
     }
     std::string target() const { return world.path("made.pcapng"); }
-
-    static std::size_t packetsIn(const std::string& path) {
-        const auto recording = Recording::open(path);
-        std::size_t count = 0;
-        while (recording && (*recording)->next()) {
-            ++count;
-        }
-        return count;
-    }
 
     /// The same as `drive`, with a session manager that writes into the file "awake".
     CommandRun driveWithSessionManager(const std::string& arguments,

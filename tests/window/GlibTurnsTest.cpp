@@ -1,10 +1,11 @@
 #include "window/GlibTurns.h"
 
+#include "tests/window/OnceAfter.h"
+
 #include <gtest/gtest.h>
 
 #include <array>
 #include <chrono>
-#include <functional>
 #include <glib-unix.h>
 #include <stdexcept>
 #include <unistd.h>
@@ -12,19 +13,8 @@
 namespace pallax {
 namespace {
 
+using doubles::onceAfter;
 using namespace std::chrono_literals;
-
-/// A timeout of GLib that calls the function once, after so many milliseconds.
-void onceAfter(guint delay, const std::function<void()>& action) {
-    g_timeout_add_full(
-        G_PRIORITY_DEFAULT, delay,
-        +[](gpointer data) -> gboolean {
-            (*static_cast<std::function<void()>*>(data))();
-            return G_SOURCE_REMOVE;
-        },
-        new std::function<void()>(action),
-        +[](gpointer data) { delete static_cast<std::function<void()>*>(data); });
-}
 
 TEST(GlibTurns, BlocksOfBothLoopsRunUntilTheQueueIsStopped) {
     AsioMainQueue queue;

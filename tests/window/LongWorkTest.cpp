@@ -2,6 +2,7 @@
 
 #include "tests/ui/gtk/WindowDump.h"
 #include "tests/ui/gtk/XDisplay.h"
+#include "tests/window/OnceAfter.h"
 #include "window/GlibTurns.h"
 
 #include <chrono>
@@ -10,6 +11,7 @@
 namespace pallax {
 namespace {
 
+using doubles::onceAfter;
 using namespace std::chrono_literals;
 using Clock = std::chrono::steady_clock;
 
@@ -48,18 +50,6 @@ struct Working {
     std::unique_ptr<LongWork> work = std::make_unique<LongWork>(queue, frame);
 };
 
-/// Calls the function once, from the toolkit's loop.
-void onceFromToolkit(guint delay, const std::function<void()>& action) {
-    g_timeout_add_full(
-        G_PRIORITY_DEFAULT, delay,
-        +[](gpointer data) -> gboolean {
-            (*static_cast<std::function<void()>*>(data))();
-            return G_SOURCE_REMOVE;
-        },
-        new std::function<void()>(action),
-        +[](gpointer data) { delete static_cast<std::function<void()>*>(data); });
-}
-
 TEST_F(LongWorkTest, OfShortWorkNothingIsToldAndNothingIsLeft) {
     Working window;
     window.run([&] {
@@ -74,7 +64,7 @@ TEST_F(LongWorkTest, TheToolkitIsServedButNoOtherBlockRuns) {
     bool isServed = false;
     bool hasBlockRun = false;
     window.run([&] {
-        onceFromToolkit(1, [&] { isServed = true; });
+        onceAfter(1, [&] { isServed = true; });
         window.queue.async([&] { hasBlockRun = true; });
         EXPECT_FALSE(window.isStopped(300ms));
         EXPECT_TRUE(window.isTold());
@@ -89,7 +79,7 @@ TEST_F(LongWorkTest, TheUserStopsItAndTheNextWorkBeginsAfresh) {
     Working window;
     for (int times = 0; times < 2; ++times) {
         window.run([&] {
-            onceFromToolkit(150, [&] {
+            onceAfter(150, [&] {
                 gboolean isHandled = FALSE;
                 g_signal_emit_by_name(window.frame.window(), "close-request", &isHandled);
             });

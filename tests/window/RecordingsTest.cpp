@@ -1,9 +1,9 @@
 #include "window/Recordings.h"
 
-#include "host/Recording.h"
 #include "platform/RecordedTechnology.h"
 #include "tests/doubles/Files.h"
 #include "tests/ui/gtk/XDisplay.h"
+#include "tests/window/PacketsIn.h"
 
 #include <csignal>
 #include <filesystem>
@@ -12,6 +12,7 @@
 namespace pallax {
 namespace {
 
+using doubles::packetsIn;
 using std::chrono::milliseconds;
 
 constexpr Time kStart{std::chrono::seconds{1700000000}};
@@ -34,14 +35,6 @@ protected:
         for (std::size_t index = 0; index < count; ++index) {
             sink(*technologyOfCommandName("lte"), kStart + milliseconds(index), packet);
         }
-    }
-    static std::size_t packetsIn(const std::string& path) {
-        const auto recording = Recording::open(path);
-        std::size_t count = 0;
-        while (recording && (*recording)->next()) {
-            ++count;
-        }
-        return count;
     }
     /// The message of the dialog that is open; "" without one.
     static std::string alert() {
