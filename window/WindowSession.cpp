@@ -122,7 +122,11 @@ gtk::TimeBar::Actions WindowSession::timeActions() {
 
 /// Outside the toolkit's frames, because a search may take long.
 void WindowSession::goTo(const std::string& place) {
-    _work.begin([this, place] { travel([&place](Travel& to) { return to.goTo(place); }); });
+    _work.begin([this, place] {
+        if (travel([&place](Travel& to) { return to.goTo(place); })) {
+            _frame.focusPanes(); // the next key is no part of a place
+        }
+    });
 }
 
 void WindowSession::findAgain(Direction direction) {
@@ -160,13 +164,15 @@ void WindowSession::wish(Wish wish) {
     });
 }
 
-void WindowSession::travel(const std::function<Travel::Refusal(Travel&)>& action) {
-    if (const Travel::Refusal refusal = action(_viewer.travel())) {
+bool WindowSession::travel(const std::function<Travel::Refusal(Travel&)>& action) {
+    const Travel::Refusal refusal = action(_viewer.travel());
+    if (refusal) {
         _frame.setMessage(*refusal);
     }
     gtk_widget_set_visible(_timeBar.widget(), TRUE);
     showInstant();
     _viewer.tellTrouble();
+    return !refusal;
 }
 
 /// The panes of the instant that travel shows, and the bar.

@@ -62,7 +62,8 @@ private:
     ViewerSession::Face face();
     ShownValues::Source valueSource();
     gtk::TimeBar::Actions timeActions();
-    void travel(const std::function<Travel::Refusal(Travel&)>& action);
+    /// False if it was refused, which the user is told.
+    bool travel(const std::function<Travel::Refusal(Travel&)>& action);
     void wish(gtk::TimeBar::Wish wish);
     void goTo(const std::string& place);
     void findAgain(Travel::Direction direction);

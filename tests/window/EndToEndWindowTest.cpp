@@ -1,5 +1,7 @@
 #include "tests/window/EndToEndWindow.h"
 
+#include "tests/doubles/TextPropertyList.h"
+
 #include <filesystem>
 #include <fstream>
 
@@ -61,6 +63,21 @@ TEST_F(EndToEndWindow, AListIsATableWithColumns) {
               "press 'Measured RSRP dBm' has 'Measured RSRP dBm, sorted, *' "
               "open 'Physical Cell ID 285, *' has 'Physical Cell ID: 285' key Escape "
               "press 'Show as Rows' lacks 'Physical Cell ID 184, *'"));
+}
+
+TEST_F(EndToEndWindow, LongListsAndLongValuesAreScrolledByKeys) {
+    constexpr int kIfxLinkType = 147;
+    Dictionary section{{"Longest", PropertyList(std::string(200, 'x'))}};
+    for (int number = 100; number < 160; ++number) {
+        section.set(Text("Value " + std::to_string(number)), PropertyList(std::to_string(number)));
+    }
+    const std::string text = doubles::textForm(Dictionary{{"Cell", section}});
+    const std::string recording = record(
+        "long.pcap", {{milliseconds(0), ByteBuffer(text.begin(), text.end())}}, kIfxLinkType);
+    expectDriven(drive(recording + " --speed max",
+                       "open 'Cell' focus 'Value 100: *' key End key Return has 'Curve: 159*' "
+                       "key Escape lacks 'Curve: 159*' key Home "
+                       "focus 'Longest: *' key Right pushed 'Longest: *' "));
 }
 
 TEST_F(EndToEndWindow, ACurveIsReadByKeysAndForAnotherTime) {

@@ -6,6 +6,7 @@
   press NAME       presses the button with this name
   open NAME        goes to the row with this name by keys, and presses Enter
   focus NAME       goes to it
+  pushed NAME      waits until the row with this name is pushed sideways
   key KEY          presses a key: Escape, Right, m
   type NAME=TEXT   puts the text into the field with this name
   menu NAME        opens the menu and chooses the entry with this name
@@ -141,6 +142,11 @@ def walk_to(name):
     sys.exit("cannot go to the row " + name + "\n" + tree())
 
 
+def is_pushed(row):
+    values = [node.get_value_iface() for node in walk(row)]
+    return any(value is not None and value.get_current_value() > 0 for value in values)
+
+
 def field(name):
     for window in windows():
         for node in walk(window):
@@ -174,6 +180,8 @@ def step(verb, argument):
         await_result(lambda: len(list(windows())) == int(argument), "not so many windows: " + argument)
     elif verb == "focus":
         walk_to(argument)
+    elif verb == "pushed":
+        await_result(lambda: is_pushed(row_of(argument)), "not pushed sideways: " + argument)
     elif verb == "key":
         press_key(argument)
     elif verb == "type":

@@ -69,6 +69,8 @@ public:
     WidgetNavigation* shownStack() const { return _stack; }
     /// The panes whose application lives.
     WidgetNavigation* liveStack() const { return _live; }
+    /// The keyboard goes to the panes.
+    void focusPanes() { gtk_widget_child_focus(GTK_WIDGET(_panes), GTK_DIR_TAB_FORWARD); }
     /// Below the panes.
     void addBar(GtkWidget* bar);
     /// Keys that go to the frame when nothing else takes them; true: taken.
