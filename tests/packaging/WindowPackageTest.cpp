@@ -103,7 +103,8 @@ TEST(WindowDescription, CompletionsAreWellFormed) {
 
 TEST(WindowDescription, ScreenshotsAreThoseOfTheDocuments) {
     const std::string text = contentOf(source(".metainfo.xml"));
-    for (const char* name : {"window.png", "window-phone.png"}) {
+    for (const char* name :
+         {"window.png", "window-graph.png", "window-phone.png", "window-phone-table.png"}) {
         EXPECT_NE(text.find(std::string("/docs/") + name + "</image>"), std::string::npos) << name;
         EXPECT_TRUE(fs::exists(std::string(PALLAX_SOURCE_DIR "/docs/") + name)) << name;
     }
