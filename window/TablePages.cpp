@@ -12,7 +12,7 @@ TablePages::TablePages(Surroundings surroundings)
     : _frame(surroundings.frame), _guard(surroundings.guard), _viewer(surroundings.viewer),
       _work(surroundings.work), _goTo(std::move(surroundings.goTo)),
       _partAt([this](const std::string& path) { return _viewer.entryPart(path); }),
-      _finder(finderSurroundings()) {}
+      _finder(finderSurroundings()), _hitWalk(hitWalkSurroundings()) {}
 
 std::vector<gtk::MenuEntry> TablePages::menu() {
     return {{"events", gtk::translated("Events"), [this] { openEvents(); }},
@@ -57,8 +57,17 @@ void TablePages::refresh() {
     }
 }
 
+bool TablePages::findAgain(Travel::Direction direction) {
+    const bool isMine = _hitWalk.isLatest();
+    if (const std::string sentence = isMine ? _hitWalk.go(direction) : ""; !sentence.empty()) {
+        _frame.setMessage(sentence);
+    }
+    return isMine;
+}
+
 void TablePages::forget() {
     _frame.closePage();
+    _hitWalk.forget();
     _events.reset();
     _search.reset();
     _query.reset();
@@ -99,11 +108,32 @@ TextFinder::Surroundings TablePages::finderSurroundings() {
 }
 
 SearchContent::Surroundings TablePages::searchSurroundings() {
-    return {
-        .finder = _finder,
-        .goToRow = [this](const std::string& /*text*/, const FoundRow& row) { goToRow(row); },
-        .goToPacket = [this](const std::string& /*text*/, std::uint64_t packet) { _goTo(packet); },
-        .ahead = [this] { return _viewer.zone(_viewer.now()).offset; }};
+    return {.finder = _finder,
+            .goToRow =
+                [this](const std::string& text, const FoundRow& row) {
+                    _hitWalk.begin(text, SearchScope::Frame);
+                    goToPlace(row.place);
+                },
+            .goToPacket =
+                [this](const std::string& text, std::uint64_t packet) {
+                    _hitWalk.begin(text, SearchScope::Recording);
+                    _goTo(packet);
+                },
+            .ahead = [this] { return _viewer.zone(_viewer.now()).offset; }};
+}
+
+HitWalk::Surroundings TablePages::hitWalkSurroundings() {
+    return {.finder = _finder,
+            .conditions = [this] { return _viewer.travel().conditions(); },
+            .isPageOpen = [this] { return _frame.isPageOpen(); },
+            .cursorPlace =
+                [this] {
+                    const gtk::WidgetNavigation& panes = *_frame.shownStack();
+                    const gtk::WidgetTable& top = gtk::widgetTable(panes.top().table());
+                    return placeOf(panes, top.cursorRow().value_or(0));
+                },
+            .goToPlace = [this](const auto& place) { goToPlace(place); },
+            .goToPacket = _goTo};
 }
 
 void TablePages::openSearch() {
@@ -120,13 +150,13 @@ void TablePages::openSearch() {
 }
 
 /// The page closes first: a row that is not seen cannot get the keyboard.
-void TablePages::goToRow(const FoundRow& row) {
+void TablePages::goToPlace(const std::vector<std::size_t>& place) {
     gtk::WidgetNavigation* const panes = _frame.shownStack();
     if (panes == nullptr) {
         return;
     }
     _frame.closePage();
-    openWay(*panes, row.place,
+    openWay(*panes, place,
             [panes](std::size_t each) { gtk::widgetTable(panes->top().table()).select(each); });
 }
 

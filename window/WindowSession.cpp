@@ -126,8 +126,11 @@ void WindowSession::goTo(const std::string& place) {
 }
 
 void WindowSession::findAgain(Direction direction) {
-    _work.begin(
-        [this, direction] { travel([direction](Travel& to) { return to.findAgain(direction); }); });
+    _work.begin([this, direction] {
+        if (!_tables.findAgain(direction)) {
+            travel([direction](Travel& to) { return to.findAgain(direction); });
+        }
+    });
 }
 
 void WindowSession::wish(Wish wish) {

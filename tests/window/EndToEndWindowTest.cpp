@@ -53,6 +53,18 @@ TEST_F(EndToEndWindow, EventsHitsAndAnswersAreTablesThatGoToTheirInstant) {
               "lacks '*, held*' open 'SIM Info'"));
 }
 
+TEST_F(EndToEndWindow, TheNextAndThePreviousHitOfATextAreFoundByKeys) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key f "
+                       "type 'Find a text in names and values=rsrp' has 'Name Average RSRP, *' "
+                       "key Return has 'Average RSRP: *' key n has 'rsrp: 2 of *' "
+                       "key N has 'rsrp: 1 of *' key f press 'Whole Recording' "
+                       "type 'Find a text in names and values=context down' "
+                       "has 'Time 22:13:53, *' key Return has '22:13:53, held*' "
+                       "lacks 'Whole Recording' key n lacks '22:13:53, held*' "
+                       "key N has '22:13:53, held*' key N has 'There is no earlier hit.'"));
+}
+
 TEST_F(EndToEndWindow, AListIsATableWithColumns) {
     expectDriven(
         drive(sample("lte-drive.pcap") + " --speed max",

@@ -33,10 +33,17 @@ void WidgetTable::refreshTable() {
     }
 }
 
+std::optional<std::size_t> WidgetTable::cursorRow() const {
+    if (isShownAsTable() && _columns != nullptr) {
+        return _columns->model().cursorRow();
+    }
+    const auto focused = focusedRow();
+    return focused ? focused : pane().cursorRow();
+}
+
 void WidgetTable::switchLook() {
     const bool wasTable = isShownAsTable();
-    const auto row =
-        wasTable && _columns != nullptr ? _columns->model().cursorRow() : pane().cursorRow();
+    const auto row = cursorRow();
     setFilter("");
     _look->asTables = !wasTable;
     reloadData();
