@@ -32,27 +32,27 @@ bool TablePages::handleKey(guint key) {
         openQuery();
         return true;
     case GDK_KEY_t:
-        if (!_frame.isPageOpen()) {
+        if (!_frame.pages().isOpen()) {
             _frame.switchLists();
         }
-        return !_frame.isPageOpen();
+        return !_frame.pages().isOpen();
     default:
         return false;
     }
 }
 
 void TablePages::toggle(GtkWidget* page, void (TablePages::*open)()) {
-    if (page != nullptr && _frame.isPageOpen(page)) {
-        _frame.closePage();
+    if (page != nullptr && _frame.pages().shows(page)) {
+        _frame.pages().close();
     } else {
         (this->*open)();
     }
 }
 
 void TablePages::refresh() {
-    if (_events && _frame.isPageOpen(_events->widget())) {
+    if (_events && _frame.pages().shows(_events->widget())) {
         _events->refresh();
-    } else if (_search && _frame.isPageOpen(_search->widget())) {
+    } else if (_search && _frame.pages().shows(_search->widget())) {
         _search->refresh();
     }
 }
@@ -66,7 +66,7 @@ bool TablePages::findAgain(Travel::Direction direction) {
 }
 
 void TablePages::forget() {
-    _frame.closePage();
+    _frame.pages().closeAll();
     _hitWalk.forget();
     _events.reset();
     _search.reset();
@@ -83,13 +83,13 @@ void TablePages::openEvents() {
         _events.emplace(_frame.metrics(), _guard,
                         gtk::EventsView::Surroundings{.events = eventsSurroundings(),
                                                       .goTo = [this](std::uint64_t packet) {
-                                                          _frame.closePage();
+                                                          _frame.pages().close();
                                                           _goTo(packet);
                                                       }});
     }
     _events->refresh();
-    _frame.openPage(_events->widget(), gtk::translated("Events"),
-                    [this](const std::string& text) { _events->table().setFilter(text); });
+    _frame.pages().open(_events->widget(), gtk::translated("Events"),
+                        [this](const std::string& text) { _events->table().setFilter(text); });
     _events->table().focusCursor();
 }
 
@@ -125,7 +125,7 @@ SearchContent::Surroundings TablePages::searchSurroundings() {
 HitWalk::Surroundings TablePages::hitWalkSurroundings() {
     return {.finder = _finder,
             .conditions = [this] { return _viewer.travel().conditions(); },
-            .isPageOpen = [this] { return _frame.isPageOpen(); },
+            .isPageOpen = [this] { return _frame.pages().isOpen(); },
             .cursorPlace =
                 [this] {
                     const gtk::WidgetNavigation& panes = *_frame.shownStack();
@@ -142,20 +142,20 @@ void TablePages::openSearch() {
                         gtk::SearchView::Surroundings{
                             .search = searchSurroundings(),
                             .work = [this](auto search) { _work.begin(std::move(search)); },
-                            .close = [this] { _frame.closePage(); }});
+                            .close = [this] { _frame.pages().close(); }});
     }
     _search->refresh();
-    _frame.openPage(_search->widget(), gtk::translated("Find a Text"));
+    _frame.pages().open(_search->widget(), gtk::translated("Find a Text"));
     _search->focus();
 }
 
-/// The page closes first: a row that is not seen cannot get the keyboard.
+/// The pages close first: a row that is not seen cannot get the keyboard.
 void TablePages::goToPlace(const std::vector<std::size_t>& place) {
     gtk::WidgetNavigation* const panes = _frame.shownStack();
     if (panes == nullptr) {
         return;
     }
-    _frame.closePage();
+    _frame.pages().closeAll();
     openWay(*panes, place,
             [panes](std::size_t each) { gtk::widgetTable(panes->top().table()).select(each); });
 }
@@ -174,12 +174,12 @@ void TablePages::openQuery() {
                        gtk::QueryView::Surroundings{
                            .queries = querySurroundings(),
                            .work = [this](auto query) { _work.begin(std::move(query)); },
-                           .close = [this] { _frame.closePage(); },
+                           .close = [this] { _frame.pages().close(); },
                            .say = [this](const std::string& text) { _frame.setMessage(text); }});
     }
-    if (!_frame.isPageOpen(_query->widget())) {
-        _frame.openPage(_query->widget(), gtk::translated("Ask in SQL"),
-                        [this](const std::string& text) { _query->table().setFilter(text); });
+    if (!_frame.pages().shows(_query->widget())) {
+        _frame.pages().open(_query->widget(), gtk::translated("Ask in SQL"),
+                            [this](const std::string& text) { _query->table().setFilter(text); });
     }
     _query->focus();
 }

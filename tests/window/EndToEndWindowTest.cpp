@@ -93,7 +93,20 @@ TEST_F(EndToEndWindow, TheGraphHasTheCurvesOfSeveralValues) {
                        "has 'In the graph (2 of 6)*' key V "
                        "has 'Curves: a  -94.50 dBm  Measured RSRP, Serving*' "
                        "has 'Curves: b  -11.00 dB  Measured RSRQ, Serving*' "
-                       "key V lacks 'Curves: a*'"));
+                       "key V lacks 'Curves: a*' has 'Remove from the Graph' "
+                       "press 'Open the Graph' has 'Curves: a*' key Escape lacks 'Curves: a*' "
+                       "has 'Remove from the Graph' key Escape lacks 'Remove from the Graph' "
+                       "has 'Measured RSRQ: *'"));
+}
+
+TEST_F(EndToEndWindow, ARowOfAValueIsAddedToTheGraphByAKey) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key v "
+                       "has 'Nothing to show here: choose a value.' "
+                       "open 'Serving Cell Measurements' focus 'Measured RSRQ: *' key v "
+                       "has 'In the graph (1 of 6): V opens it.' key V "
+                       "has 'Curves: a  -11.00 dB  Measured RSRQ, Serving*' key Escape "
+                       "focus 'Measured RSRQ: *' key v has 'No longer in the graph.'"));
 }
 
 TEST_F(EndToEndWindow, WhatDiffersFromTheMarkIsAPage) {

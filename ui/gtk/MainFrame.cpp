@@ -22,7 +22,6 @@ constexpr int kLeastWidth = 320;
 constexpr int kLeastHeight = 240;
 constexpr const char* kPanesPage = "panes";
 constexpr const char* kModalPage = "modal";
-constexpr const char* kOpenedPage = "opened";
 constexpr const char* kEndedPage = "ended";
 
 } // namespace
@@ -32,7 +31,8 @@ MainFrame::MainFrame(GtkApplication* application, const Guard& guard, Actions ac
       _window(shared(GTK_WIDGET(
           g_object_new(ADW_TYPE_APPLICATION_WINDOW, "application", application, nullptr)))),
       _metrics(_window.get()), _toasts(ADW_TOAST_OVERLAY(adw_toast_overlay_new())),
-      _pages(GTK_STACK(gtk_stack_new())), _header(ADW_HEADER_BAR(adw_header_bar_new())),
+      _pages(GTK_STACK(gtk_stack_new())), _opened(_pages, _guard),
+      _header(ADW_HEADER_BAR(adw_header_bar_new())),
       _title(ADW_WINDOW_TITLE(adw_window_title_new("Pallax", ""))),
       _back(GTK_BUTTON(gtk_button_new_from_icon_name("go-previous-symbolic"))),
       _oldValues(GTK_LABEL(gtk_label_new(nullptr))), _panes(ADW_BIN(adw_bin_new())),
@@ -200,10 +200,10 @@ void MainFrame::addBar(GtkWidget* bar) {
 }
 
 void MainFrame::toggleSearch() {
-    if (_page == nullptr) {
+    if (_opened.isOpen()) {
+        _opened.toggleFilter();
+    } else {
         _filter.toggle();
-    } else if (_pageFilter) {
-        _pageFilter->toggle();
     }
 }
 
@@ -276,38 +276,6 @@ void MainFrame::modalChanged() {
     }
 }
 
-void MainFrame::openPage(GtkWidget* widget, const std::string& title,
-                         std::function<void(const std::string& text)> filter) {
-    closePage();
-    GtkWidget* header = adw_header_bar_new();
-    GtkWidget* backButton = gtk_button_new_from_icon_name("go-previous-symbolic");
-    nameWidget(backButton, translated("Back"));
-    onSignal(backButton, "clicked", _guard, [this] { closePage(); });
-    adw_header_bar_pack_start(ADW_HEADER_BAR(header), backButton);
-    adw_header_bar_set_title_widget(ADW_HEADER_BAR(header),
-                                    adw_window_title_new(shownText(title).c_str(), ""));
-    _page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
-    gtk_box_append(GTK_BOX(_page), header);
-    if (filter) {
-        _pageFilter.emplace(_guard, std::move(filter));
-        gtk_box_append(GTK_BOX(_page), _pageFilter->widget());
-    }
-    gtk_box_append(GTK_BOX(_page), widget);
-    gtk_stack_add_named(_pages, _page, kOpenedPage);
-    gtk_stack_set_visible_child_name(_pages, kOpenedPage);
-    gtk_widget_grab_focus(backButton);
-}
-
-/// The widget belongs to whoever gave it, and may come back.
-void MainFrame::closePage() {
-    if (_page != nullptr) {
-        gtk_box_remove(GTK_BOX(_page), gtk_widget_get_last_child(_page));
-        gtk_stack_set_visible_child_name(_pages, kPanesPage);
-        gtk_stack_remove(_pages, std::exchange(_page, nullptr));
-        _pageFilter.reset();
-    }
-}
-
 void MainFrame::showWork(const std::string& words, std::function<void()> stop) {
     _work.show(_pages, _guard, words, std::move(stop));
 }
@@ -369,8 +337,8 @@ void MainFrame::showEnded(const std::string& sentence) {
 }
 
 void MainFrame::back() {
-    if (_page != nullptr) {
-        closePage();
+    if (_opened.isOpen()) {
+        _opened.close();
     } else if (_stack != nullptr && _stack->modal() != nullptr) {
         _stack->modal()->cancelPressed();
     } else if (_stack != nullptr) {

@@ -3,6 +3,7 @@
 #include "platform/ui/Geometry.h"
 #include "platform/ui/Views.h"
 #include "ui/gtk/FilterBar.h"
+#include "ui/gtk/PageStack.h"
 #include "ui/gtk/PangoMetrics.h"
 #include "ui/gtk/Ref.h"
 #include "ui/gtk/Remarks.h"
@@ -12,7 +13,6 @@
 
 #include <adwaita.h>
 #include <functional>
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -84,15 +84,9 @@ public:
         _leaf = std::move(action);
     }
     void leafSelected(const std::string& path, const std::string& text) { _leaf(path, text); }
-    /// A page over the panes, until the user goes back. `filter` shows only what contains a text,
-    /// for pages that can.
-    void openPage(GtkWidget* widget, const std::string& title,
-                  std::function<void(const std::string& text)> filter = nullptr);
-    bool isPageOpen() const { return _page != nullptr; }
-    bool isPageOpen(GtkWidget* widget) const {
-        return _page != nullptr && gtk_widget_get_parent(widget) == _page;
-    }
-    void closePage();
+    /// The pages over the panes.
+    PageStack& pages() { return _opened; }
+    const PageStack& pages() const { return _opened; }
     /// Long work, in place of everything: what is going on, and a button that stops it. No other
     /// key or button does anything meanwhile. Words again replace the latest.
     void showWork(const std::string& words, std::function<void()> stop);
@@ -120,13 +114,13 @@ private:
     AdwToastOverlay* _toasts;
     Ref<AdwToast> _message; ///< the latest
     GtkStack* _pages;
+    PageStack _opened;
     AdwHeaderBar* _header;
     AdwWindowTitle* _title;
     GtkButton* _back;
     GtkLabel* _oldValues;
     AdwBin* _panes;
     FilterBar _filter; ///< of the topmost pane
-    std::optional<FilterBar> _pageFilter;
     GtkButton* _lists; ///< shows a list as a table, or as rows
     GtkBox* _bars;     ///< below the panes
     GtkBox* _toolbar;
@@ -134,7 +128,6 @@ private:
     GtkLabel* _status;
     GtkButton* _save;
     GtkWidget* _modal = nullptr;
-    GtkWidget* _page = nullptr;
     WorkCover _work;
     std::function<void(const std::string&, const std::string&)> _leaf =
         [](const std::string& /*path*/, const std::string& /*text*/) {};

@@ -271,6 +271,13 @@ std::optional<std::size_t> WidgetTable::focusedRow() const {
     return std::nullopt;
 }
 
+std::optional<std::string> WidgetTable::focusedValue() const {
+    const auto row = focusedRow();
+    const NodeRef node = row ? pane().nodeAt(*row) : nullptr;
+    const bool isValue = node != nullptr && node->childNodes() == nullptr;
+    return isValue ? std::optional(childPath(pane().path(), node->displayName())) : std::nullopt;
+}
+
 /// The keys that scroll the row with the focus sideways.
 gboolean WidgetTable::handleKey(guint key) {
     constexpr double kStep = 40; // points

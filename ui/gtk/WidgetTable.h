@@ -59,6 +59,8 @@ public:
     /// The row of the source under the keyboard or, if that is elsewhere, the one that was selected
     /// last.
     std::optional<std::size_t> cursorRow() const;
+    /// The path in the display of the row under the keyboard; nothing unless it shows a value.
+    std::optional<std::string> focusedValue() const;
     /// Shows lists as tables, or as rows again. The cursor stays on its entry.
     void switchLook();
     /// Brings a row of the source into view, and the keyboard to it. Clears the filter if it hides

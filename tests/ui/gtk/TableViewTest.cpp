@@ -20,13 +20,13 @@ protected:
         });
         view->model().show(cells());
         view->refresh();
-        stage->frame.openPage(view->widget(), "Cells");
+        stage->frame.pages().open(view->widget(), "Cells");
         stage->settle();
         stage->settle();
     }
     void TearDown() override {
         if (stage != nullptr) {
-            stage->frame.closePage();
+            stage->frame.pages().close();
             stage->settle();
         }
         view = nullptr;

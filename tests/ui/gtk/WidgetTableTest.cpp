@@ -121,6 +121,20 @@ TEST_F(WidgetTableRows, TheCursorIsOnTheRowWithTheKeyboardOrThatWasSelectedLast)
     EXPECT_EQ(stage.table().cursorRow(), 0U);
 }
 
+TEST_F(WidgetTableRows, TellsTheValueUnderTheKeyboard) {
+    WindowStage stage(360, 400);
+    stage.tick(Dictionary{{"A", "1"}, {"Cell", Dictionary{{"RSRP", "-94 dBm"}}}});
+    gtk_window_set_focus(stage.frame.window(), nullptr);
+    EXPECT_EQ(stage.frame.shownStack()->focusedValue(), std::nullopt);
+    gtk_widget_grab_focus(rowWidget(stage, 0));
+    EXPECT_EQ(stage.frame.shownStack()->focusedValue(), "/A");
+    gtk_widget_grab_focus(rowWidget(stage, 1));
+    EXPECT_EQ(stage.frame.shownStack()->focusedValue(), std::nullopt) << "a pane";
+    stage.select(1);
+    gtk_widget_grab_focus(rowWidget(stage, 0));
+    EXPECT_EQ(stage.frame.shownStack()->focusedValue(), "/Cell/RSRP");
+}
+
 TEST_F(WidgetTableRows, WhatHasChangedIsMarkedForOneTick) {
     WindowStage stage(360, 400);
     stage.tick(Dictionary{{"A", "1"}});
