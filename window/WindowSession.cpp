@@ -251,6 +251,8 @@ void WindowSession::toggleSafe() {
     _isSafe = !_isSafe;
     _tables.forget();
     _pages.clear();
+    _frame.closeSearch();
+    _timeBar.clearPlace();
     forgetInstant();
     _viewer.setSafe(_isSafe);
     _overview.show(_viewer.overview());

@@ -77,6 +77,8 @@ public:
     }
     /// The field that filters what is seen: the topmost pane, or the page.
     void toggleSearch();
+    /// Closes that of the panes, so that the topmost one shows all rows.
+    void closeSearch() { _filter.close(); }
     /// Shows lists as tables, or as rows; says so where there is no list.
     void switchLists();
     /// A row with a value was selected.
