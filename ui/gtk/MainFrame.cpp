@@ -16,8 +16,6 @@ namespace {
 
 constexpr int kUsualWidth = 1000;
 constexpr int kUsualHeight = 700;
-constexpr int kMessageWidth = 28;    // characters of a line: what a phone has room for
-constexpr guint kMessageSeconds = 3; // it covers the time bar
 constexpr int kLeastWidth = 320;
 constexpr int kLeastHeight = 240;
 constexpr const char* kPanesPage = "panes";
@@ -30,9 +28,8 @@ MainFrame::MainFrame(GtkApplication* application, const Guard& guard, Actions ac
     : _guard(guard), _actions(std::move(actions)),
       _window(shared(GTK_WIDGET(
           g_object_new(ADW_TYPE_APPLICATION_WINDOW, "application", application, nullptr)))),
-      _metrics(_window.get()), _toasts(ADW_TOAST_OVERLAY(adw_toast_overlay_new())),
-      _pages(GTK_STACK(gtk_stack_new())), _opened(_pages, _guard),
-      _header(ADW_HEADER_BAR(adw_header_bar_new())),
+      _metrics(_window.get()), _messages(_guard), _pages(GTK_STACK(gtk_stack_new())),
+      _opened(_pages, _guard), _header(ADW_HEADER_BAR(adw_header_bar_new())),
       _title(ADW_WINDOW_TITLE(adw_window_title_new("Pallax", ""))),
       _back(GTK_BUTTON(gtk_button_new_from_icon_name("go-previous-symbolic"))),
       _oldValues(GTK_LABEL(gtk_label_new(nullptr))), _panes(ADW_BIN(adw_bin_new())),
@@ -72,17 +69,20 @@ void MainFrame::build() {
     gtk_widget_add_css_class(GTK_WIDGET(_oldValues), "pallax-banner");
     gtk_label_set_wrap(_oldValues, TRUE);
     showText(_oldValues, "");
-    gtk_widget_set_vexpand(GTK_WIDGET(_panes), TRUE);
+    GtkWidget* panes = GTK_WIDGET(_messages.panes());
+    adw_toast_overlay_set_child(_messages.panes(), GTK_WIDGET(_panes));
+    gtk_widget_set_vexpand(panes, TRUE);
 
     GtkWidget* page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
-    for (GtkWidget* child : {GTK_WIDGET(_header), _filter.widget(), GTK_WIDGET(_oldValues),
-                             GTK_WIDGET(_panes), GTK_WIDGET(_bars), buildToolbar()}) {
+    for (GtkWidget* child : {GTK_WIDGET(_header), _filter.widget(), GTK_WIDGET(_oldValues), panes,
+                             GTK_WIDGET(_bars), buildToolbar()}) {
         gtk_box_append(GTK_BOX(page), child);
     }
     gtk_stack_add_named(_pages, page, kPanesPage);
     gtk_stack_set_transition_type(_pages, GTK_STACK_TRANSITION_TYPE_OVER_UP_DOWN);
-    adw_toast_overlay_set_child(_toasts, GTK_WIDGET(_pages));
-    adw_application_window_set_content(ADW_APPLICATION_WINDOW(_window.get()), GTK_WIDGET(_toasts));
+    adw_toast_overlay_set_child(_messages.window(), GTK_WIDGET(_pages));
+    adw_application_window_set_content(ADW_APPLICATION_WINDOW(_window.get()),
+                                       GTK_WIDGET(_messages.window()));
 }
 
 GtkWidget* MainFrame::buildToolbar() {
@@ -302,21 +302,6 @@ void MainFrame::showAlert(const ui::Alert& alert) {
     adw_message_dialog_add_response(dialog, kClose, alert.button.c_str());
     adw_message_dialog_set_close_response(dialog, kClose);
     gtk_window_present(GTK_WINDOW(dialog));
-}
-
-void MainFrame::setMessage(const std::string& text) {
-    if (_message) {
-        adw_toast_dismiss(_message.get()); // it would be shown for its time before the next one
-    }
-    _message = shared(adw_toast_new(""));
-    adw_toast_set_timeout(_message.get(), kMessageSeconds);
-    GtkWidget* label = gtk_label_new(shownText(text).c_str());
-    gtk_label_set_wrap(GTK_LABEL(label), TRUE); // a title would be cut on a phone
-    gtk_label_set_wrap_mode(GTK_LABEL(label), PANGO_WRAP_WORD_CHAR); // a file's name has no spaces
-    gtk_label_set_max_width_chars(GTK_LABEL(label), kMessageWidth);
-    gtk_widget_add_css_class(label, "heading");
-    adw_toast_set_custom_title(_message.get(), label);
-    adw_toast_overlay_add_toast(_toasts, _message.get());
 }
 
 void MainFrame::setOrigin(const std::string& technology, const std::string& source) {

@@ -3,6 +3,7 @@
 #include "platform/ui/Geometry.h"
 #include "platform/ui/Views.h"
 #include "ui/gtk/FilterBar.h"
+#include "ui/gtk/Messages.h"
 #include "ui/gtk/PageStack.h"
 #include "ui/gtk/PangoMetrics.h"
 #include "ui/gtk/Ref.h"
@@ -49,7 +50,7 @@ public:
     void showAlert(const ui::Alert& alert);
 
     /// Shows an event that has just happened, for some seconds or until the next one.
-    void setMessage(const std::string& text);
+    void setMessage(const std::string& text) { _messages.show(text); }
     Remarks& remarks() { return _remarks; }
     void setOrigin(const std::string& technology, const std::string& source);
     /// The values are from before this time; "": they are current.
@@ -112,9 +113,8 @@ private:
     WidgetNavigation* _stack = nullptr; ///< that is shown: the live one, or that of an instant
     WidgetNavigation* _live = nullptr;
     std::function<bool(guint, GdkModifierType)> _key = [](guint, GdkModifierType) { return false; };
+    Messages _messages;
     // The window owns what follows.
-    AdwToastOverlay* _toasts;
-    Ref<AdwToast> _message; ///< the latest
     GtkStack* _pages;
     PageStack _opened;
     AdwHeaderBar* _header;
