@@ -156,6 +156,9 @@ void TablePages::goToPlace(const std::vector<std::size_t>& place) {
         return;
     }
     _frame.pages().closeAll();
+    if (panes->isDetailOnTop()) { // over the root's rows
+        _frame.toggleDetail();
+    }
     openWay(*panes, place,
             [panes](std::size_t each) { gtk::widgetTable(panes->top().table()).select(each); });
 }

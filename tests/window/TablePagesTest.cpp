@@ -97,6 +97,18 @@ TEST_F(TablePagesTest, AHitOfAnInstantIsARowOfAPane) {
     EXPECT_EQ(cursor(), "Average RSRP");
 }
 
+TEST_F(TablePagesTest, AHitOfTheRootPaneIsNotCoveredByTheOverview) {
+    constexpr int kPhone = 360;
+    constexpr int kPhoneHeight = 720;
+    gtk_window_set_default_size(stage->frame.window(), kPhone, kPhoneHeight);
+    EXPECT_TRUE(stage->await([&] { return !stage->frame.shownStack()->isSideBySide(); }));
+    stage->frame.toggleDetail();
+    stage->awaitShown("title: Overview");
+    find("sim info", "cells (cursor): SIM Info");
+    stage->awaitShown("title: Pallax");
+    EXPECT_TRUE(stage->await([&] { return cursor() == "SIM Info"; }));
+}
+
 TEST_F(TablePagesTest, AConditionThatCameLaterIsFoundAgainInstead) {
     find("average rsrp", "Average RSRP | -94.75 dBm | Serving Cell Measurements");
     EXPECT_TRUE(stage->await([&] { return cursor() == "Average RSRP"; }));
