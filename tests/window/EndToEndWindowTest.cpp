@@ -166,7 +166,9 @@ TEST_F(EndToEndWindow, SpeaksGermanButKeepsTheModemsTexts) {
 }
 
 TEST_F(EndToEndWindow, ClosingTheWindowEndsTheProgram) {
-    expectDriven(drive("demo", "has 'SIM Info' press Close lacks 'SIM Info'"));
+    expectDriven(runOnBus("timeout -s KILL 60 " PALLAX_PROGRAM " demo & p=$!\n" +
+                          driving("has 'SIM Info' press Close lacks 'SIM Info'") +
+                          "wait $p; exit $?\n"));
 }
 
 TEST_F(EndToEndWindow, ASnapshotIsSaved) {

@@ -28,8 +28,8 @@ MainFrame::MainFrame(GtkApplication* application, const Guard& guard, Actions ac
     : _guard(guard), _actions(std::move(actions)),
       _window(shared(GTK_WIDGET(
           g_object_new(ADW_TYPE_APPLICATION_WINDOW, "application", application, nullptr)))),
-      _metrics(_window.get()), _messages(_guard), _pages(GTK_STACK(gtk_stack_new())),
-      _opened(_pages, _guard), _header(ADW_HEADER_BAR(adw_header_bar_new())),
+      _metrics(_window.get()), _messages(_guard), _layers(GTK_STACK(gtk_stack_new())),
+      _pages(_layers, _guard), _header(ADW_HEADER_BAR(adw_header_bar_new())),
       _title(ADW_WINDOW_TITLE(adw_window_title_new("Pallax", ""))),
       _back(GTK_BUTTON(gtk_button_new_from_icon_name("go-previous-symbolic"))),
       _oldValues(GTK_LABEL(gtk_label_new(nullptr))), _panes(ADW_BIN(adw_bin_new())),
@@ -78,9 +78,9 @@ void MainFrame::build() {
                              GTK_WIDGET(_bars), buildToolbar()}) {
         gtk_box_append(GTK_BOX(page), child);
     }
-    gtk_stack_add_named(_pages, page, kPanesPage);
-    gtk_stack_set_transition_type(_pages, GTK_STACK_TRANSITION_TYPE_OVER_UP_DOWN);
-    adw_toast_overlay_set_child(_messages.window(), GTK_WIDGET(_pages));
+    gtk_stack_add_named(_layers, page, kPanesPage);
+    gtk_stack_set_transition_type(_layers, GTK_STACK_TRANSITION_TYPE_OVER_UP_DOWN);
+    adw_toast_overlay_set_child(_messages.window(), GTK_WIDGET(_layers));
     adw_application_window_set_content(ADW_APPLICATION_WINDOW(_window.get()),
                                        GTK_WIDGET(_messages.window()));
 }
@@ -200,8 +200,8 @@ void MainFrame::addBar(GtkWidget* bar) {
 }
 
 void MainFrame::toggleSearch() {
-    if (_opened.isOpen()) {
-        _opened.toggleFilter();
+    if (_pages.isOpen()) {
+        _pages.toggleFilter();
     } else {
         _filter.toggle();
     }
@@ -265,19 +265,19 @@ void MainFrame::showToolbarItems(const ui::BarItems& items) {
 void MainFrame::modalChanged() {
     const bool isOpen = _stack != nullptr && _stack->modal() != nullptr;
     if (_modal != nullptr) {
-        gtk_stack_set_visible_child_name(_pages, kPanesPage);
-        gtk_stack_remove(_pages, std::exchange(_modal, nullptr));
+        gtk_stack_set_visible_child_name(_layers, kPanesPage);
+        gtk_stack_remove(_layers, std::exchange(_modal, nullptr));
     }
     if (isOpen) {
         _modal = saveScreen(*_stack->modal(), _guard);
-        gtk_stack_add_named(_pages, _modal, kModalPage);
-        gtk_stack_set_visible_child_name(_pages, kModalPage);
+        gtk_stack_add_named(_layers, _modal, kModalPage);
+        gtk_stack_set_visible_child_name(_layers, kModalPage);
         gtk_widget_grab_focus(widgetTextField(_stack->modal()->field()).widget());
     }
 }
 
 void MainFrame::showWork(const std::string& words, std::function<void()> stop) {
-    _work.show(_pages, _guard, words, std::move(stop));
+    _work.show(_layers, _guard, words, std::move(stop));
 }
 
 void MainFrame::endWork() {
@@ -316,14 +316,14 @@ void MainFrame::setOldValues(const std::string& time) {
 
 void MainFrame::showEnded(const std::string& sentence) {
     const EndedPage page = endedPage(sentence, _guard, _actions.closed);
-    gtk_stack_add_named(_pages, page.widget, kEndedPage);
-    gtk_stack_set_visible_child_name(_pages, kEndedPage);
+    gtk_stack_add_named(_layers, page.widget, kEndedPage);
+    gtk_stack_set_visible_child_name(_layers, kEndedPage);
     gtk_widget_grab_focus(page.button);
 }
 
 void MainFrame::back() {
-    if (_opened.isOpen()) {
-        _opened.close();
+    if (_pages.isOpen()) {
+        _pages.close();
     } else if (_stack != nullptr && _stack->modal() != nullptr) {
         _stack->modal()->cancelPressed();
     } else if (_stack != nullptr) {

@@ -88,8 +88,8 @@ public:
     }
     void leafSelected(const std::string& path, const std::string& text) { _leaf(path, text); }
     /// The pages over the panes.
-    PageStack& pages() { return _opened; }
-    const PageStack& pages() const { return _opened; }
+    PageStack& pages() { return _pages; }
+    const PageStack& pages() const { return _pages; }
     /// Long work, in place of everything: what is going on, and a button that stops it. No other
     /// key or button does anything meanwhile. Words again replace the latest.
     void showWork(const std::string& words, std::function<void()> stop);
@@ -115,8 +115,8 @@ private:
     std::function<bool(guint, GdkModifierType)> _key = [](guint, GdkModifierType) { return false; };
     Messages _messages;
     // The window owns what follows.
-    GtkStack* _pages;
-    PageStack _opened;
+    GtkStack* _layers;
+    PageStack _pages;
     AdwHeaderBar* _header;
     AdwWindowTitle* _title;
     GtkButton* _back;
