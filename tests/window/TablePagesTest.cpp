@@ -29,6 +29,13 @@ protected:
                                                       GTK_TYPE_SEARCH_ENTRY),
                               "activate");
     }
+    /// Makes the window as narrow as a phone.
+    void narrow() {
+        constexpr int kWidth = 360;
+        constexpr int kHeight = 720;
+        gtk_window_set_default_size(stage->frame.window(), kWidth, kHeight);
+        EXPECT_TRUE(stage->await([&] { return !stage->frame.shownStack()->isSideBySide(); }));
+    }
     /// The name of the row with the cursor in the topmost pane.
     std::string cursor() const {
         const gtk::WidgetTable& table = stage->table();
@@ -97,11 +104,27 @@ TEST_F(TablePagesTest, AHitOfAnInstantIsARowOfAPane) {
     EXPECT_EQ(cursor(), "Average RSRP");
 }
 
+TEST_F(TablePagesTest, TheRowOfAHitGetsTheKeyboard) {
+    const auto hasKeyboard = [this](const std::string& path) {
+        return stage->await([&] { return stage->frame.shownStack()->focusedValue() == path; });
+    };
+    find("measured rsrp", "Measured RSRP | -94.50 dBm");
+    EXPECT_TRUE(hasKeyboard("/Serving Cell Measurements/Measured RSRP"));
+    gtk_window_set_focus_visible(stage->frame.window(), FALSE);
+    stage->press(GDK_KEY_n);
+    EXPECT_TRUE(hasKeyboard("/Neighbor Cells List/0/Measured RSRP"));
+    EXPECT_TRUE(gtk_window_get_focus_visible(stage->frame.window()));
+    narrow();
+    stage->press(GDK_KEY_n);
+    EXPECT_TRUE(hasKeyboard("/Neighbor Cells List/1/Measured RSRP"));
+    stage->press(GDK_KEY_n);
+    EXPECT_TRUE(hasKeyboard("/Serving Cell Measurements/Measured RSRP"));
+    stage->press(GDK_KEY_n);
+    EXPECT_TRUE(hasKeyboard("/Neighbor Cells List/0/Measured RSRP"));
+}
+
 TEST_F(TablePagesTest, AHitOfTheRootPaneIsNotCoveredByTheOverview) {
-    constexpr int kPhone = 360;
-    constexpr int kPhoneHeight = 720;
-    gtk_window_set_default_size(stage->frame.window(), kPhone, kPhoneHeight);
-    EXPECT_TRUE(stage->await([&] { return !stage->frame.shownStack()->isSideBySide(); }));
+    narrow();
     stage->frame.toggleDetail();
     stage->awaitShown("title: Overview");
     find("sim info", "cells (cursor): SIM Info");
