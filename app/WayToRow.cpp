@@ -11,6 +11,16 @@ PallaxPaneController& paneAt(const ui::NavigationStack& panes, std::size_t depth
     return dynamic_cast<PallaxPaneController&>(*panes.screens()[depth]);
 }
 
+/// The row of a node among its siblings; 0 if it is not one of them.
+std::size_t rowOf(const PaneModel& pane, const NodeRef& node) {
+    for (std::size_t row = 0; row < pane.totalRows(); ++row) {
+        if (pane.nodeAt(row) == node) {
+            return row;
+        }
+    }
+    return 0;
+}
+
 } // namespace
 
 void openWay(ui::NavigationStack& panes, const std::vector<std::size_t>& place,
@@ -27,6 +37,15 @@ void openWay(ui::NavigationStack& panes, const std::vector<std::size_t>& place,
         paneAt(panes, depth).didSelectRow(place[depth]);
     }
     select(place.back());
+}
+
+std::vector<std::size_t> placeOf(const ui::NavigationStack& panes, std::size_t row) {
+    std::vector<std::size_t> place;
+    for (std::size_t depth = 1; depth < panes.screens().size(); ++depth) {
+        place.push_back(rowOf(paneAt(panes, depth - 1).pane(), paneAt(panes, depth).pane().node()));
+    }
+    place.push_back(row);
+    return place;
 }
 
 } // namespace pallax

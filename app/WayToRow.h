@@ -16,4 +16,7 @@ class NavigationStack;
 void openWay(ui::NavigationStack& panes, const std::vector<std::size_t>& place,
              const std::function<void(std::size_t row)>& select);
 
+/// The place of a row of the topmost pane, as `openWay` takes it.
+std::vector<std::size_t> placeOf(const ui::NavigationStack& panes, std::size_t row);
+
 } // namespace pallax

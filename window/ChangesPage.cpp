@@ -10,18 +10,18 @@ void ChangesPage::mark() {
 }
 
 void ChangesPage::toggle() {
-    if (isOpen()) {
-        return _frame.closePage();
+    if (isOnTop()) {
+        return _frame.pages().close();
     }
     if (!_travel.marked()) {
         return _frame.setMessage(kNothingMarked);
     }
     show();
-    _frame.openPage(_view.widget(), gtk::translated("Changes"));
+    _frame.pages().open(_view.widget(), gtk::translated("Changes"));
 }
 
 void ChangesPage::update() {
-    if (isOpen()) {
+    if (isOnTop()) {
         show();
     }
 }

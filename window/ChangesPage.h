@@ -16,13 +16,13 @@ public:
     void mark();
     /// Opens the page, or closes it.
     void toggle();
-    /// Shows the changes at the shown instant, if the page is open.
+    /// Shows the changes at the shown instant, if the page is on top.
     void update();
     /// The timeline is another one.
     void forget() { _content.forget(); }
 
 private:
-    bool isOpen() const { return gtk_widget_get_parent(_view.widget()) != nullptr; }
+    bool isOnTop() const { return _frame.pages().shows(_view.widget()); }
     void show();
 
     gtk::MainFrame& _frame;

@@ -14,16 +14,6 @@ namespace pallax {
 
 namespace {
 
-/// Whether OpenGL has a graphics processor. Without one, this processor would do its work, which
-/// takes longer than the toolkit's own drawing, and 70 MB more.
-bool hasGraphicsProcessor() {
-    std::error_code missing;
-    const std::filesystem::directory_iterator devices("/dev/dri", missing);
-    return std::any_of(begin(devices), end(devices), [](const auto& device) {
-        return device.path().filename().string().starts_with("render");
-    });
-}
-
 /// Beside the program where it was built, or where it is installed.
 std::string translationsFolder() {
     const std::filesystem::path folder = std::filesystem::path(windowProgram()).parent_path();
@@ -35,10 +25,18 @@ std::string translationsFolder() {
 
 } // namespace
 
+bool hasGraphicsProcessor(const std::string& folder) {
+    std::error_code missing;
+    const std::filesystem::directory_iterator devices(folder, missing);
+    return std::any_of(begin(devices), end(devices), [](const auto& device) {
+        return device.path().filename().string().starts_with("render");
+    });
+}
+
 bool startToolkit() {
     gtk_disable_setlocale(); // numbers are written and read in the same way everywhere
     gtk::useTranslations(translationsFolder().c_str());
-    if (!hasGraphicsProcessor()) {
+    if (!hasGraphicsProcessor("/dev/dri")) {
         g_setenv("GSK_RENDERER", "cairo", FALSE); // unless the user has chosen
     }
     if (gtk_init_check() == FALSE) {

@@ -12,7 +12,7 @@ TablePages::TablePages(Surroundings surroundings)
     : _frame(surroundings.frame), _guard(surroundings.guard), _viewer(surroundings.viewer),
       _work(surroundings.work), _goTo(std::move(surroundings.goTo)),
       _partAt([this](const std::string& path) { return _viewer.entryPart(path); }),
-      _finder(finderSurroundings()) {}
+      _finder(finderSurroundings()), _hitWalk(hitWalkSurroundings()) {}
 
 std::vector<gtk::MenuEntry> TablePages::menu() {
     return {{"events", gtk::translated("Events"), [this] { openEvents(); }},
@@ -32,33 +32,42 @@ bool TablePages::handleKey(guint key) {
         openQuery();
         return true;
     case GDK_KEY_t:
-        if (!_frame.isPageOpen()) {
+        if (!_frame.pages().isOpen()) {
             _frame.switchLists();
         }
-        return !_frame.isPageOpen();
+        return !_frame.pages().isOpen();
     default:
         return false;
     }
 }
 
 void TablePages::toggle(GtkWidget* page, void (TablePages::*open)()) {
-    if (page != nullptr && _frame.isPageOpen(page)) {
-        _frame.closePage();
+    if (page != nullptr && _frame.pages().shows(page)) {
+        _frame.pages().close();
     } else {
         (this->*open)();
     }
 }
 
 void TablePages::refresh() {
-    if (_events && _frame.isPageOpen(_events->widget())) {
+    if (_events && _frame.pages().shows(_events->widget())) {
         _events->refresh();
-    } else if (_search && _frame.isPageOpen(_search->widget())) {
+    } else if (_search && _frame.pages().shows(_search->widget())) {
         _search->refresh();
     }
 }
 
+bool TablePages::findAgain(Travel::Direction direction) {
+    const bool isMine = _hitWalk.isLatest();
+    if (const std::string sentence = isMine ? _hitWalk.go(direction) : ""; !sentence.empty()) {
+        _frame.setMessage(sentence);
+    }
+    return isMine;
+}
+
 void TablePages::forget() {
-    _frame.closePage();
+    _frame.pages().closeAll();
+    _hitWalk.forget();
     _events.reset();
     _search.reset();
     _query.reset();
@@ -74,13 +83,13 @@ void TablePages::openEvents() {
         _events.emplace(_frame.metrics(), _guard,
                         gtk::EventsView::Surroundings{.events = eventsSurroundings(),
                                                       .goTo = [this](std::uint64_t packet) {
-                                                          _frame.closePage();
+                                                          _frame.pages().close();
                                                           _goTo(packet);
                                                       }});
     }
     _events->refresh();
-    _frame.openPage(_events->widget(), gtk::translated("Events"),
-                    [this](const std::string& text) { _events->table().setFilter(text); });
+    _frame.pages().open(_events->widget(), gtk::translated("Events"),
+                        [this](const std::string& text) { _events->table().setFilter(text); });
     _events->table().focusCursor();
 }
 
@@ -99,11 +108,32 @@ TextFinder::Surroundings TablePages::finderSurroundings() {
 }
 
 SearchContent::Surroundings TablePages::searchSurroundings() {
-    return {
-        .finder = _finder,
-        .goToRow = [this](const std::string& /*text*/, const FoundRow& row) { goToRow(row); },
-        .goToPacket = [this](const std::string& /*text*/, std::uint64_t packet) { _goTo(packet); },
-        .ahead = [this] { return _viewer.zone(_viewer.now()).offset; }};
+    return {.finder = _finder,
+            .goToRow =
+                [this](const std::string& text, const FoundRow& row) {
+                    _hitWalk.begin(text, SearchScope::Frame);
+                    goToPlace(row.place);
+                },
+            .goToPacket =
+                [this](const std::string& text, std::uint64_t packet) {
+                    _hitWalk.begin(text, SearchScope::Recording);
+                    _goTo(packet);
+                },
+            .ahead = [this] { return _viewer.zone(_viewer.now()).offset; }};
+}
+
+HitWalk::Surroundings TablePages::hitWalkSurroundings() {
+    return {.finder = _finder,
+            .conditions = [this] { return _viewer.travel().conditions(); },
+            .isPageOpen = [this] { return _frame.pages().isOpen(); },
+            .cursorPlace =
+                [this] {
+                    const gtk::WidgetNavigation& panes = *_frame.shownStack();
+                    const gtk::WidgetTable& top = gtk::widgetTable(panes.top().table());
+                    return placeOf(panes, top.cursorRow().value_or(0));
+                },
+            .goToPlace = [this](const auto& place) { goToPlace(place); },
+            .goToPacket = _goTo};
 }
 
 void TablePages::openSearch() {
@@ -112,21 +142,24 @@ void TablePages::openSearch() {
                         gtk::SearchView::Surroundings{
                             .search = searchSurroundings(),
                             .work = [this](auto search) { _work.begin(std::move(search)); },
-                            .close = [this] { _frame.closePage(); }});
+                            .close = [this] { _frame.pages().close(); }});
     }
     _search->refresh();
-    _frame.openPage(_search->widget(), gtk::translated("Find a Text"));
+    _frame.pages().open(_search->widget(), gtk::translated("Find a Text"));
     _search->focus();
 }
 
-/// The page closes first: a row that is not seen cannot get the keyboard.
-void TablePages::goToRow(const FoundRow& row) {
+/// The pages close first: a row that is not seen cannot get the keyboard.
+void TablePages::goToPlace(const std::vector<std::size_t>& place) {
     gtk::WidgetNavigation* const panes = _frame.shownStack();
     if (panes == nullptr) {
         return;
     }
-    _frame.closePage();
-    openWay(*panes, row.place,
+    _frame.pages().closeAll();
+    if (panes->isDetailOnTop()) { // over the root's rows
+        _frame.toggleDetail();
+    }
+    openWay(*panes, place,
             [panes](std::size_t each) { gtk::widgetTable(panes->top().table()).select(each); });
 }
 
@@ -144,12 +177,12 @@ void TablePages::openQuery() {
                        gtk::QueryView::Surroundings{
                            .queries = querySurroundings(),
                            .work = [this](auto query) { _work.begin(std::move(query)); },
-                           .close = [this] { _frame.closePage(); },
+                           .close = [this] { _frame.pages().close(); },
                            .say = [this](const std::string& text) { _frame.setMessage(text); }});
     }
-    if (!_frame.isPageOpen(_query->widget())) {
-        _frame.openPage(_query->widget(), gtk::translated("Ask in SQL"),
-                        [this](const std::string& text) { _query->table().setFilter(text); });
+    if (!_frame.pages().shows(_query->widget())) {
+        _frame.pages().open(_query->widget(), gtk::translated("Ask in SQL"),
+                            [this](const std::string& text) { _query->table().setFilter(text); });
     }
     _query->focus();
 }

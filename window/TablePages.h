@@ -1,7 +1,7 @@
 #pragma once
 
 #include "browsing/ViewerSession.h"
-#include "ui/contents/TextFinder.h"
+#include "ui/contents/HitWalk.h"
 #include "ui/gtk/EventsView.h"
 #include "ui/gtk/MainFrame.h"
 #include "ui/gtk/Menu.h"
@@ -37,6 +37,9 @@ public:
     std::vector<gtk::MenuEntry> menu();
     /// The same keys as on a terminal; false if it means nothing here.
     bool handleKey(guint key);
+    /// Goes to the next or previous hit of the latest search for a text; false if none came after
+    /// the latest condition.
+    bool findAgain(Travel::Direction direction);
     /// New data have come, or another instant is shown.
     void refresh();
     /// The timeline is another one.
@@ -53,7 +56,8 @@ private:
     void openSearch();
     void openQuery();
     void toggle(GtkWidget* page, void (TablePages::*open)());
-    void goToRow(const FoundRow& row);
+    HitWalk::Surroundings hitWalkSurroundings();
+    void goToPlace(const std::vector<std::size_t>& place);
 
     gtk::MainFrame& _frame;
     gtk::Guard _guard;
@@ -62,6 +66,7 @@ private:
     std::function<void(std::uint64_t packet)> _goTo;
     EntryPartAt _partAt;
     TextFinder _finder;
+    HitWalk _hitWalk;
     std::optional<gtk::EventsView> _events;
     std::optional<gtk::SearchView> _search;
     std::optional<gtk::QueryView> _query;

@@ -43,27 +43,24 @@ void ValuePages::openValue(const std::string& path, const std::string& text) {
     _rowText = text;
     _valueReading.leave();
     showValue();
-    _frame.openPage(_value.widget(), path.substr(path.rfind('/') + 1));
+    _frame.pages().open(_value.widget(), path.substr(path.rfind('/') + 1));
 }
 
 void ValuePages::openGraph() {
     showGraph();
-    _frame.openPage(_graphView.widget(), gtk::translated("Graph"));
+    _frame.pages().open(_graphView.widget(), gtk::translated("Graph"));
 }
 
 void ValuePages::clear() {
-    if (isValueOpen() || isGraphOpen()) {
-        _frame.closePage();
-    }
     _graph = {};
     _content.reset();
     _rowText.clear();
 }
 
 void ValuePages::update() {
-    if (isValueOpen()) {
+    if (isValueOnTop()) {
         showValue();
-    } else if (isGraphOpen()) {
+    } else if (isGraphOnTop()) {
         showGraph();
     }
 }
@@ -146,8 +143,14 @@ void ValuePages::toggleInGraph() {
         _frame.setMessage(_graph.toggle(*_content->leaf()));
         showValue();
     } else {
-        _frame.setMessage("Only numbers have a curve.");
+        _frame.setMessage(kOnlyNumbers);
     }
+}
+
+void ValuePages::toggleFocusedInGraph() {
+    const gtk::WidgetNavigation* panes = _frame.shownStack();
+    const auto path = panes != nullptr ? panes->focusedValue() : std::nullopt;
+    _frame.setMessage(path ? pallax::toggleInGraph(_graph, _values, *path) : kNoValueHere);
 }
 
 void ValuePages::chooseSpan(std::size_t span) {
@@ -165,17 +168,21 @@ void ValuePages::point(std::optional<Time> time) {
 }
 
 bool ValuePages::handleKey(guint key) {
-    const bool isOpen = isValueOpen() || isGraphOpen();
+    const bool isOpen = isValueOnTop() || isGraphOnTop();
     if (key == GDK_KEY_V) {
-        isGraphOpen() ? _frame.closePage() : openGraph();
+        isGraphOnTop() ? _frame.pages().close() : openGraph();
         return true;
     }
-    if (key == GDK_KEY_v && isValueOpen()) {
+    if (key == GDK_KEY_v && isValueOnTop()) {
         toggleInGraph();
         return true;
     }
-    if (key == GDK_KEY_i && isValueOpen()) {
-        _frame.closePage();
+    if (key == GDK_KEY_v && !_frame.pages().isOpen()) {
+        toggleFocusedInGraph();
+        return true;
+    }
+    if (key == GDK_KEY_i && isValueOnTop()) {
+        _frame.pages().close();
         return true;
     }
     return isOpen && reading().hasCurve() && handleCurveKey(key);

@@ -25,7 +25,7 @@ public:
     /// `text` is that of the row, for a value that belongs to no field.
     void openValue(const std::string& path, const std::string& text);
     void openGraph();
-    /// Shows what is known now, if a page is open.
+    /// Shows what is known now, if a page is on top.
     void update();
     /// How long ago the value at a path of the display was read; nothing if that is unknown.
     std::optional<std::chrono::nanoseconds> ageAt(const std::string& path) {
@@ -34,19 +34,22 @@ public:
     }
     /// The timeline is another one.
     void forget() { _values.forget(); }
-    /// Other values may be shown from now on: forgets which were, also in the graph.
+    /// Other values may be shown from now on: forgets which were, also in the graph. The pages are
+    /// closed.
     void clear();
-    /// The keys of the page that is open, the same as on a terminal, and V; false for any other.
+    /// The keys of the page on top, the same as on a terminal, and V, and v in a pane; false
+    /// for any other.
     bool handleKey(guint key);
 
 private:
-    bool isValueOpen() const { return gtk_widget_get_parent(_value.widget()) != nullptr; }
-    bool isGraphOpen() const { return gtk_widget_get_parent(_graphView.widget()) != nullptr; }
+    bool isValueOnTop() const { return _frame.pages().shows(_value.widget()); }
+    bool isGraphOnTop() const { return _frame.pages().shows(_graphView.widget()); }
     void showValue();
     void showGraph();
     void toggleInGraph();
-    /// What is read with the cursor on the page that is open.
-    CurveReading& reading() { return isGraphOpen() ? _graphReading : _valueReading; }
+    void toggleFocusedInGraph();
+    /// What is read with the cursor on the page on top.
+    CurveReading& reading() { return isGraphOnTop() ? _graphReading : _valueReading; }
     void chooseSpan(std::size_t span);
     void point(std::optional<Time> time);
     bool handleCurveKey(guint key);

@@ -54,6 +54,7 @@ WindowSession::WindowSession(Setup setup)
                         .ageAt = [this](const auto& path) { return _pages.ageAt(path); }};
     _viewer.attach(_toolkit);
     _frame.onLeaf([this](const auto& path, const auto& text) { _pages.openValue(path, text); });
+    _frame.pages().onUncovered([this] { showPage(); });
     _frame.setDetail(_overview.widget(), gtk::translated("Overview"));
     if (setup.request.settings.firstScreen == FirstScreen::Overview) {
         _frame.toggleDetail();
@@ -61,7 +62,7 @@ WindowSession::WindowSession(Setup setup)
 }
 
 WindowSession::~WindowSession() {
-    _frame.closePage();
+    _frame.pages().closeAll();
     forgetInstant();
     _viewer.detach();
 }
@@ -96,6 +97,11 @@ void WindowSession::tick() {
         _overview.show(_viewer.overview());
     }
     showTimeBar();
+    showPage();
+}
+
+/// The page on top, if there is one.
+void WindowSession::showPage() {
     _pages.update();
     _changes.update();
     _tables.refresh();
@@ -130,8 +136,11 @@ void WindowSession::goTo(const std::string& place) {
 }
 
 void WindowSession::findAgain(Direction direction) {
-    _work.begin(
-        [this, direction] { travel([direction](Travel& to) { return to.findAgain(direction); }); });
+    _work.begin([this, direction] {
+        if (!_tables.findAgain(direction)) {
+            travel([direction](Travel& to) { return to.findAgain(direction); });
+        }
+    });
 }
 
 void WindowSession::wish(Wish wish) {
@@ -194,9 +203,7 @@ void WindowSession::showInstant() {
     }
     _overview.show(_viewer.overview());
     showTimeBar();
-    _pages.update();
-    _changes.update();
-    _tables.refresh();
+    showPage();
 }
 
 /// The live panes come back before those of the instant go.
@@ -248,9 +255,11 @@ void WindowSession::toggleSafe() {
             gtk::translated("A stream can be played only once: start the viewer with --safe."));
     }
     _isSafe = !_isSafe;
-    _pages.clear();
-    forgetInstant();
     _tables.forget();
+    _pages.clear();
+    _frame.closeSearch();
+    _timeBar.clearPlace();
+    forgetInstant();
     _viewer.setSafe(_isSafe);
     _overview.show(_viewer.overview());
 }

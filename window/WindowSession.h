@@ -70,6 +70,7 @@ private:
     void typePlace();
     void changeSpeed(void (Travel::*change)());
     void showInstant();
+    void showPage();
     void showTimeBar();
     void forgetInstant();
     void tick();

@@ -223,15 +223,21 @@ void TableModel::reverse() {
     arrange();
 }
 
-void TableModel::hideChosen() {
-    if (!_chosen || columns().size() < 2) {
+void TableModel::hide(std::size_t column) {
+    if (columns().size() < 2) {
         return;
     }
-    const std::size_t place = placeOf(*_chosen);
-    _hiddenNames.push_back(*_chosenName);
+    const std::size_t place = placeOf(column);
+    _hiddenNames.push_back(_content.columns[column].name);
     const std::vector<std::size_t> visible = choices();
-    if (!visible.empty()) { // several columns may have had this name
+    if (_chosen && isHidden(*_chosen) && !visible.empty()) { // several may have had this name
         choose(visible[std::min(place, visible.size() - 1)]);
+    }
+}
+
+void TableModel::hideChosen() {
+    if (_chosen) {
+        hide(*_chosen);
     }
 }
 

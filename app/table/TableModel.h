@@ -61,7 +61,8 @@ public:
     void chooseNext();
     void choosePrevious();
     void reverse();
-    /// Hides the chosen column and chooses its neighbour. The last column stays.
+    /// Hides a column; if it was chosen, its neighbour is. The last column stays.
+    void hide(std::size_t column);
     void hideChosen();
     void showAllColumns();
 

@@ -54,5 +54,11 @@ TEST_F(WayToRowTest, PanesThatAreOpenStayAndOthersAreLeft) {
     EXPECT_EQ(selected.back(), 0U);
 }
 
+TEST_F(WayToRowTest, ThePlaceOfARowLeadsToItAgain) {
+    EXPECT_EQ(placeOf(*application.stack, 1), (std::vector<std::size_t>{1}));
+    go({1, 1, 1});
+    EXPECT_EQ(placeOf(*application.stack, 0), (std::vector<std::size_t>{1, 1, 0}));
+}
+
 } // namespace
 } // namespace pallax

@@ -55,6 +55,18 @@ TEST_F(EndToEndWindow, EventsHitsAndAnswersAreTablesThatGoToTheirInstant) {
               "lacks '*, held*' open 'SIM Info'"));
 }
 
+TEST_F(EndToEndWindow, TheNextAndThePreviousHitOfATextAreFoundByKeys) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key f "
+                       "type 'Find a text in names and values=rsrp' has 'Name Average RSRP, *' "
+                       "key Return has 'Average RSRP: *' key n has 'rsrp: 2 of *' "
+                       "key N has 'rsrp: 1 of *' key f press 'Whole Recording' "
+                       "type 'Find a text in names and values=context down' "
+                       "has 'Time 22:13:53, *' key Return has '22:13:53, held*' "
+                       "lacks 'Whole Recording' key n lacks '22:13:53, held*' "
+                       "key N has '22:13:53, held*' key N has 'There is no earlier hit.'"));
+}
+
 TEST_F(EndToEndWindow, AListIsATableWithColumns) {
     expectDriven(
         drive(sample("lte-drive.pcap") + " --speed max",
@@ -98,7 +110,20 @@ TEST_F(EndToEndWindow, TheGraphHasTheCurvesOfSeveralValues) {
                        "has 'In the graph (2 of 6)*' key V "
                        "has 'Curves: a  -94.50 dBm  Measured RSRP, Serving*' "
                        "has 'Curves: b  -11.00 dB  Measured RSRQ, Serving*' "
-                       "key V lacks 'Curves: a*'"));
+                       "key V lacks 'Curves: a*' has 'Remove from the Graph' "
+                       "press 'Open the Graph' has 'Curves: a*' key Escape lacks 'Curves: a*' "
+                       "has 'Remove from the Graph' key Escape lacks 'Remove from the Graph' "
+                       "has 'Measured RSRQ: *'"));
+}
+
+TEST_F(EndToEndWindow, ARowOfAValueIsAddedToTheGraphByAKey) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key v "
+                       "has 'Nothing to show here: choose a value.' "
+                       "open 'Serving Cell Measurements' focus 'Measured RSRQ: *' key v "
+                       "has 'In the graph (1 of 6): V opens it.' key V "
+                       "has 'Curves: a  -11.00 dB  Measured RSRQ, Serving*' key Escape "
+                       "focus 'Measured RSRQ: *' key v has 'No longer in the graph.'"));
 }
 
 TEST_F(EndToEndWindow, WhatDiffersFromTheMarkIsAPage) {
@@ -158,7 +183,9 @@ TEST_F(EndToEndWindow, SpeaksGermanButKeepsTheModemsTexts) {
 }
 
 TEST_F(EndToEndWindow, ClosingTheWindowEndsTheProgram) {
-    expectDriven(drive("demo", "has 'SIM Info' press Close lacks 'SIM Info'"));
+    expectDriven(runOnBus("timeout -s KILL 60 " PALLAX_PROGRAM " demo & p=$!\n" +
+                          driving("has 'SIM Info' press Close lacks 'SIM Info'") +
+                          "wait $p; exit $?\n"));
 }
 
 TEST_F(EndToEndWindow, ASnapshotIsSaved) {

@@ -13,7 +13,7 @@ namespace {
 
 using doubles::onceAfter;
 using namespace std::chrono_literals;
-using Clock = std::chrono::steady_clock;
+using SteadyClock = std::chrono::steady_clock;
 
 class LongWorkTest : public gtk::DisplayTest {};
 
@@ -31,8 +31,8 @@ struct Working {
     }
     /// Asks for so long, or until it may not go on; whether it was stopped.
     bool isStopped(std::chrono::milliseconds length) {
-        const auto end = Clock::now() + length;
-        while (Clock::now() < end) {
+        const auto end = SteadyClock::now() + length;
+        while (SteadyClock::now() < end) {
             if (!work->mayGoOn("Working. Esc stops.")) {
                 return true;
             }
@@ -83,9 +83,9 @@ TEST_F(LongWorkTest, TheUserStopsItAndTheNextWorkBeginsAfresh) {
                 gboolean isHandled = FALSE;
                 g_signal_emit_by_name(window.frame.window(), "close-request", &isHandled);
             });
-            const auto begin = Clock::now();
+            const auto begin = SteadyClock::now();
             EXPECT_TRUE(window.isStopped(10s));
-            EXPECT_LT(Clock::now() - begin, 5s);
+            EXPECT_LT(SteadyClock::now() - begin, 5s);
         });
         EXPECT_FALSE(window.isTold());
     }

@@ -4,6 +4,7 @@
 #include "ui/contents/TimeOfDay.h"
 
 #include <algorithm>
+#include <cmath>
 #include <utility>
 
 namespace pallax {
@@ -27,6 +28,15 @@ std::string nameOf(const LeafName& leaf, const FieldInfo& field) {
 }
 
 } // namespace
+
+std::string toggleInGraph(Graph& graph, ShownValues& shown, std::string_view path) {
+    shown.update();
+    const CurrentValues* values = shown.values();
+    const auto leaf = values != nullptr ? leafAt(*values, path) : std::nullopt;
+    const auto value = leaf ? valueOf(*values, *leaf) : std::nullopt;
+    const bool isNumber = value && leaf->inner.empty() && std::isfinite(value->value.number);
+    return isNumber ? graph.toggle(*leaf) : kOnlyNumbers;
+}
 
 std::vector<GraphPlot> graphPlots(ShownValues& shown, const Graph& graph,
                                   const CurveReading& reading, std::size_t points) {

@@ -6,6 +6,7 @@
 
 #include <cstddef>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace pallax {
@@ -24,6 +25,13 @@ struct GraphPlot {
     std::string unit;
     std::vector<GraphCurve> curves;
 };
+
+inline constexpr const char* kOnlyNumbers = "Only numbers have a curve.";
+inline constexpr const char* kNoValueHere = "Nothing to show here: choose a value.";
+
+/// Adds the value at a path of the display to the graph or, if it is there, takes it away. Returns
+/// a sentence about it.
+std::string toggleInGraph(Graph& graph, ShownValues& shown, std::string_view path);
 
 /// The curves of the graph at the shown instant, with at least so many points. Values of another
 /// technology are left out.

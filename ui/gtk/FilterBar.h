@@ -18,6 +18,7 @@ public:
     FilterBar& operator=(const FilterBar&) = delete;
 
     void toggle();
+    void close() { gtk_search_bar_set_search_mode(_bar.get(), FALSE); }
     GtkWidget* widget() const { return GTK_WIDGET(_bar.get()); }
 
 private:

@@ -16,13 +16,10 @@ namespace {
 
 constexpr int kUsualWidth = 1000;
 constexpr int kUsualHeight = 700;
-constexpr int kMessageWidth = 28;    // characters of a line: what a phone has room for
-constexpr guint kMessageSeconds = 3; // it covers the time bar
 constexpr int kLeastWidth = 320;
 constexpr int kLeastHeight = 240;
 constexpr const char* kPanesPage = "panes";
 constexpr const char* kModalPage = "modal";
-constexpr const char* kOpenedPage = "opened";
 constexpr const char* kEndedPage = "ended";
 
 } // namespace
@@ -31,8 +28,8 @@ MainFrame::MainFrame(GtkApplication* application, const Guard& guard, Actions ac
     : _guard(guard), _actions(std::move(actions)),
       _window(shared(GTK_WIDGET(
           g_object_new(ADW_TYPE_APPLICATION_WINDOW, "application", application, nullptr)))),
-      _metrics(_window.get()), _toasts(ADW_TOAST_OVERLAY(adw_toast_overlay_new())),
-      _pages(GTK_STACK(gtk_stack_new())), _header(ADW_HEADER_BAR(adw_header_bar_new())),
+      _metrics(_window.get()), _messages(_guard), _layers(GTK_STACK(gtk_stack_new())),
+      _pages(_layers, _guard), _header(ADW_HEADER_BAR(adw_header_bar_new())),
       _title(ADW_WINDOW_TITLE(adw_window_title_new("Pallax", ""))),
       _back(GTK_BUTTON(gtk_button_new_from_icon_name("go-previous-symbolic"))),
       _oldValues(GTK_LABEL(gtk_label_new(nullptr))), _panes(ADW_BIN(adw_bin_new())),
@@ -72,17 +69,20 @@ void MainFrame::build() {
     gtk_widget_add_css_class(GTK_WIDGET(_oldValues), "pallax-banner");
     gtk_label_set_wrap(_oldValues, TRUE);
     showText(_oldValues, "");
-    gtk_widget_set_vexpand(GTK_WIDGET(_panes), TRUE);
+    GtkWidget* panes = GTK_WIDGET(_messages.panes());
+    adw_toast_overlay_set_child(_messages.panes(), GTK_WIDGET(_panes));
+    gtk_widget_set_vexpand(panes, TRUE);
 
     GtkWidget* page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
-    for (GtkWidget* child : {GTK_WIDGET(_header), _filter.widget(), GTK_WIDGET(_oldValues),
-                             GTK_WIDGET(_panes), GTK_WIDGET(_bars), buildToolbar()}) {
+    for (GtkWidget* child : {GTK_WIDGET(_header), _filter.widget(), GTK_WIDGET(_oldValues), panes,
+                             GTK_WIDGET(_bars), buildToolbar()}) {
         gtk_box_append(GTK_BOX(page), child);
     }
-    gtk_stack_add_named(_pages, page, kPanesPage);
-    gtk_stack_set_transition_type(_pages, GTK_STACK_TRANSITION_TYPE_OVER_UP_DOWN);
-    adw_toast_overlay_set_child(_toasts, GTK_WIDGET(_pages));
-    adw_application_window_set_content(ADW_APPLICATION_WINDOW(_window.get()), GTK_WIDGET(_toasts));
+    gtk_stack_add_named(_layers, page, kPanesPage);
+    gtk_stack_set_transition_type(_layers, GTK_STACK_TRANSITION_TYPE_OVER_UP_DOWN);
+    adw_toast_overlay_set_child(_messages.window(), GTK_WIDGET(_layers));
+    adw_application_window_set_content(ADW_APPLICATION_WINDOW(_window.get()),
+                                       GTK_WIDGET(_messages.window()));
 }
 
 GtkWidget* MainFrame::buildToolbar() {
@@ -200,10 +200,10 @@ void MainFrame::addBar(GtkWidget* bar) {
 }
 
 void MainFrame::toggleSearch() {
-    if (_page == nullptr) {
+    if (_pages.isOpen()) {
+        _pages.toggleFilter();
+    } else {
         _filter.toggle();
-    } else if (_pageFilter) {
-        _pageFilter->toggle();
     }
 }
 
@@ -265,51 +265,19 @@ void MainFrame::showToolbarItems(const ui::BarItems& items) {
 void MainFrame::modalChanged() {
     const bool isOpen = _stack != nullptr && _stack->modal() != nullptr;
     if (_modal != nullptr) {
-        gtk_stack_set_visible_child_name(_pages, kPanesPage);
-        gtk_stack_remove(_pages, std::exchange(_modal, nullptr));
+        gtk_stack_set_visible_child_name(_layers, kPanesPage);
+        gtk_stack_remove(_layers, std::exchange(_modal, nullptr));
     }
     if (isOpen) {
         _modal = saveScreen(*_stack->modal(), _guard);
-        gtk_stack_add_named(_pages, _modal, kModalPage);
-        gtk_stack_set_visible_child_name(_pages, kModalPage);
+        gtk_stack_add_named(_layers, _modal, kModalPage);
+        gtk_stack_set_visible_child_name(_layers, kModalPage);
         gtk_widget_grab_focus(widgetTextField(_stack->modal()->field()).widget());
     }
 }
 
-void MainFrame::openPage(GtkWidget* widget, const std::string& title,
-                         std::function<void(const std::string& text)> filter) {
-    closePage();
-    GtkWidget* header = adw_header_bar_new();
-    GtkWidget* backButton = gtk_button_new_from_icon_name("go-previous-symbolic");
-    nameWidget(backButton, translated("Back"));
-    onSignal(backButton, "clicked", _guard, [this] { closePage(); });
-    adw_header_bar_pack_start(ADW_HEADER_BAR(header), backButton);
-    adw_header_bar_set_title_widget(ADW_HEADER_BAR(header),
-                                    adw_window_title_new(shownText(title).c_str(), ""));
-    _page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
-    gtk_box_append(GTK_BOX(_page), header);
-    if (filter) {
-        _pageFilter.emplace(_guard, std::move(filter));
-        gtk_box_append(GTK_BOX(_page), _pageFilter->widget());
-    }
-    gtk_box_append(GTK_BOX(_page), widget);
-    gtk_stack_add_named(_pages, _page, kOpenedPage);
-    gtk_stack_set_visible_child_name(_pages, kOpenedPage);
-    gtk_widget_grab_focus(backButton);
-}
-
-/// The widget belongs to whoever gave it, and may come back.
-void MainFrame::closePage() {
-    if (_page != nullptr) {
-        gtk_box_remove(GTK_BOX(_page), gtk_widget_get_last_child(_page));
-        gtk_stack_set_visible_child_name(_pages, kPanesPage);
-        gtk_stack_remove(_pages, std::exchange(_page, nullptr));
-        _pageFilter.reset();
-    }
-}
-
 void MainFrame::showWork(const std::string& words, std::function<void()> stop) {
-    _work.show(_pages, _guard, words, std::move(stop));
+    _work.show(_layers, _guard, words, std::move(stop));
 }
 
 void MainFrame::endWork() {
@@ -336,21 +304,6 @@ void MainFrame::showAlert(const ui::Alert& alert) {
     gtk_window_present(GTK_WINDOW(dialog));
 }
 
-void MainFrame::setMessage(const std::string& text) {
-    if (_message) {
-        adw_toast_dismiss(_message.get()); // it would be shown for its time before the next one
-    }
-    _message = shared(adw_toast_new(""));
-    adw_toast_set_timeout(_message.get(), kMessageSeconds);
-    GtkWidget* label = gtk_label_new(shownText(text).c_str());
-    gtk_label_set_wrap(GTK_LABEL(label), TRUE); // a title would be cut on a phone
-    gtk_label_set_wrap_mode(GTK_LABEL(label), PANGO_WRAP_WORD_CHAR); // a file's name has no spaces
-    gtk_label_set_max_width_chars(GTK_LABEL(label), kMessageWidth);
-    gtk_widget_add_css_class(label, "heading");
-    adw_toast_set_custom_title(_message.get(), label);
-    adw_toast_overlay_add_toast(_toasts, _message.get());
-}
-
 void MainFrame::setOrigin(const std::string& technology, const std::string& source) {
     const std::string text = technology.empty() ? source : technology + " · " + source;
     adw_window_title_set_subtitle(_title, shownText(text).c_str());
@@ -363,14 +316,14 @@ void MainFrame::setOldValues(const std::string& time) {
 
 void MainFrame::showEnded(const std::string& sentence) {
     const EndedPage page = endedPage(sentence, _guard, _actions.closed);
-    gtk_stack_add_named(_pages, page.widget, kEndedPage);
-    gtk_stack_set_visible_child_name(_pages, kEndedPage);
+    gtk_stack_add_named(_layers, page.widget, kEndedPage);
+    gtk_stack_set_visible_child_name(_layers, kEndedPage);
     gtk_widget_grab_focus(page.button);
 }
 
 void MainFrame::back() {
-    if (_page != nullptr) {
-        closePage();
+    if (_pages.isOpen()) {
+        _pages.close();
     } else if (_stack != nullptr && _stack->modal() != nullptr) {
         _stack->modal()->cancelPressed();
     } else if (_stack != nullptr) {

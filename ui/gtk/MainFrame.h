@@ -3,6 +3,8 @@
 #include "platform/ui/Geometry.h"
 #include "platform/ui/Views.h"
 #include "ui/gtk/FilterBar.h"
+#include "ui/gtk/Messages.h"
+#include "ui/gtk/PageStack.h"
 #include "ui/gtk/PangoMetrics.h"
 #include "ui/gtk/Ref.h"
 #include "ui/gtk/Remarks.h"
@@ -12,7 +14,6 @@
 
 #include <adwaita.h>
 #include <functional>
-#include <optional>
 #include <string>
 #include <vector>
 
@@ -49,7 +50,7 @@ public:
     void showAlert(const ui::Alert& alert);
 
     /// Shows an event that has just happened, for some seconds or until the next one.
-    void setMessage(const std::string& text);
+    void setMessage(const std::string& text) { _messages.show(text); }
     Remarks& remarks() { return _remarks; }
     void setOrigin(const std::string& technology, const std::string& source);
     /// The values are from before this time; "": they are current.
@@ -79,6 +80,8 @@ public:
     }
     /// The field that filters what is seen: the topmost pane, or the page.
     void toggleSearch();
+    /// Closes that of the panes, so that the topmost one shows all rows.
+    void closeSearch() { _filter.close(); }
     /// Shows lists as tables, or as rows; says so where there is no list.
     void switchLists();
     /// A row with a value was selected.
@@ -86,15 +89,9 @@ public:
         _leaf = std::move(action);
     }
     void leafSelected(const std::string& path, const std::string& text) { _leaf(path, text); }
-    /// A page over the panes, until the user goes back. `filter` shows only what contains a text,
-    /// for pages that can.
-    void openPage(GtkWidget* widget, const std::string& title,
-                  std::function<void(const std::string& text)> filter = nullptr);
-    bool isPageOpen() const { return _page != nullptr; }
-    bool isPageOpen(GtkWidget* widget) const {
-        return _page != nullptr && gtk_widget_get_parent(widget) == _page;
-    }
-    void closePage();
+    /// The pages over the panes.
+    PageStack& pages() { return _pages; }
+    const PageStack& pages() const { return _pages; }
     /// Long work, in place of everything: what is going on, and a button that stops it. No other
     /// key or button does anything meanwhile. Words again replace the latest.
     void showWork(const std::string& words, std::function<void()> stop);
@@ -118,17 +115,16 @@ private:
     WidgetNavigation* _stack = nullptr; ///< that is shown: the live one, or that of an instant
     WidgetNavigation* _live = nullptr;
     std::function<bool(guint, GdkModifierType)> _key = [](guint, GdkModifierType) { return false; };
+    Messages _messages;
     // The window owns what follows.
-    AdwToastOverlay* _toasts;
-    Ref<AdwToast> _message; ///< the latest
-    GtkStack* _pages;
+    GtkStack* _layers;
+    PageStack _pages;
     AdwHeaderBar* _header;
     AdwWindowTitle* _title;
     GtkButton* _back;
     GtkLabel* _oldValues;
     AdwBin* _panes;
     FilterBar _filter; ///< of the topmost pane
-    std::optional<FilterBar> _pageFilter;
     GtkButton* _lists; ///< shows a list as a table, or as rows
     GtkBox* _bars;     ///< below the panes
     GtkBox* _toolbar;
@@ -136,7 +132,6 @@ private:
     GtkLabel* _status;
     GtkButton* _save;
     GtkWidget* _modal = nullptr;
-    GtkWidget* _page = nullptr;
     WorkCover _work;
     std::function<void(const std::string&, const std::string&)> _leaf =
         [](const std::string& /*path*/, const std::string& /*text*/) {};

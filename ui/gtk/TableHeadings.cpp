@@ -44,9 +44,8 @@ GtkWidget* buildContent(const ColumnPlan::Place& place, const char* icon,
 } // namespace
 
 TableHeadings::TableHeadings(const PangoMetrics& metrics, const Guard& guard,
-                             GtkAdjustment* sideways,
-                             std::function<void(std::size_t column)> pressed)
-    : _metrics(metrics), _guard(guard), _pressed(std::move(pressed)),
+                             GtkAdjustment* sideways, Actions actions)
+    : _metrics(metrics), _guard(guard), _actions(std::move(actions)),
       _strip(ColumnStrip::Kind::Headings, sideways) {
     gtk_widget_add_css_class(widget(), "pallax-headings");
 }
@@ -64,6 +63,7 @@ void TableHeadings::show(const TableModel& table, const ColumnPlan& plan) {
         focusedColumn.push_back(_shown->plan.places[index].column);
     }
     _shown = std::move(wanted);
+    closeMenu();
     _buttons.clear();
     std::size_t lines = 1;
     for (const ColumnPlan::Place& place : plan.places) {
@@ -81,7 +81,7 @@ void TableHeadings::show(const TableModel& table, const ColumnPlan& plan) {
     gtk_widget_set_visible(widget(), _buttons.empty() ? FALSE : TRUE);
 }
 
-GtkWidget* TableHeadings::heading(const TableModel& table, const ColumnPlan::Place& place) const {
+GtkWidget* TableHeadings::heading(const TableModel& table, const ColumnPlan::Place& place) {
     const bool isChosen = table.chosenColumn() == place.column;
     const bool isDescending = table.isDescending();
     const char* icon = !isChosen ? nullptr : isDescending ? "pan-down-symbolic" : "pan-up-symbolic";
@@ -95,8 +95,47 @@ GtkWidget* TableHeadings::heading(const TableModel& table, const ColumnPlan::Pla
                                         : translated(", sorted, least first");
     const std::string name = shownText(headingOf(table.content().columns[place.column])) + sorted;
     nameWidget(button, name.c_str());
-    onSignal(button, "clicked", _guard, [this, column = place.column] { _pressed(column); });
+    const std::size_t column = place.column;
+    onSignal(button, "clicked", _guard, [this, column] { _actions.press(column); });
+    GtkGesture* click = gtk_gesture_click_new();
+    gtk_gesture_single_set_button(GTK_GESTURE_SINGLE(click), GDK_BUTTON_SECONDARY);
+    for (GtkGesture* gesture : {click, gtk_gesture_long_press_new()}) {
+        // Before the button gets it, which then is not pressed.
+        gtk_event_controller_set_propagation_phase(GTK_EVENT_CONTROLLER(gesture),
+                                                   GTK_PHASE_CAPTURE);
+        onSignal(gesture, "pressed", _guard, [this, gesture, button, column] {
+            gtk_gesture_set_state(gesture, GTK_EVENT_SEQUENCE_CLAIMED);
+            openMenu(button, column);
+        });
+        gtk_widget_add_controller(button, GTK_EVENT_CONTROLLER(gesture));
+    }
     return button;
+}
+
+void TableHeadings::openMenu(GtkWidget* heading, std::size_t column) {
+    closeMenu();
+    _menu = gtk_popover_new();
+    GtkWidget* entries = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
+    const auto add = [&](const char* words, std::function<void()> action) {
+        GtkWidget* entry = gtk_button_new_with_label(words);
+        gtk_widget_add_css_class(entry, "flat");
+        onSignal(entry, "clicked", _guard, [this, action = std::move(action)] {
+            gtk_popover_popdown(GTK_POPOVER(_menu));
+            action();
+        });
+        gtk_box_append(GTK_BOX(entries), entry);
+    };
+    add(translated("Hide Column"), [this, column] { _actions.hide(column); });
+    add(translated("Show All Columns"), _actions.showAll);
+    gtk_popover_set_child(GTK_POPOVER(_menu), entries);
+    gtk_widget_set_parent(_menu, heading);
+    gtk_popover_popup(GTK_POPOVER(_menu));
+}
+
+void TableHeadings::closeMenu() {
+    if (_menu != nullptr) {
+        gtk_widget_unparent(std::exchange(_menu, nullptr));
+    }
 }
 
 } // namespace pallax::gtk

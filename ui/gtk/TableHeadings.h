@@ -13,12 +13,22 @@
 
 namespace pallax::gtk {
 
-/// The headings of a table, which are buttons.
+/// The headings of a table, which are buttons. A long press, or the other button of a mouse, opens
+/// the menu of a column.
 class TableHeadings {
 public:
+    struct Actions {
+        std::function<void(std::size_t column)> press;
+        std::function<void(std::size_t column)> hide;
+        std::function<void()> showAll;
+    };
+
     /// `metrics` and the adjustment must outlive the headings.
     TableHeadings(const PangoMetrics& metrics, const Guard& guard, GtkAdjustment* sideways,
-                  std::function<void(std::size_t column)> pressed);
+                  Actions actions);
+    ~TableHeadings() { closeMenu(); }
+    TableHeadings(const TableHeadings&) = delete;
+    TableHeadings& operator=(const TableHeadings&) = delete;
 
     /// Marks the column by which the rows are sorted.
     void show(const TableModel& table, const ColumnPlan& plan);
@@ -34,14 +44,17 @@ private:
         bool operator==(const Shown&) const = default;
     };
 
-    GtkWidget* heading(const TableModel& table, const ColumnPlan::Place& place) const;
+    GtkWidget* heading(const TableModel& table, const ColumnPlan::Place& place);
+    void openMenu(GtkWidget* heading, std::size_t column);
+    void closeMenu();
 
     const PangoMetrics& _metrics;
     Guard _guard;
-    std::function<void(std::size_t column)> _pressed;
+    Actions _actions;
     ColumnStrip _strip;
     std::optional<Shown> _shown;
     std::vector<GtkWidget*> _buttons; ///< one for each place of the plan
+    GtkWidget* _menu = nullptr;       ///< the latest, on one of the buttons
 };
 
 } // namespace pallax::gtk

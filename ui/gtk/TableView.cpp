@@ -21,11 +21,19 @@ TableView::TableView(const PangoMetrics& metrics, const Guard& guard, std::funct
       _items(g_list_store_new(G_TYPE_OBJECT)) {
     makeList();
     GtkAdjustment* sideways = gtk_scrolled_window_get_hadjustment(_scroller);
-    _headings =
-        std::make_unique<TableHeadings>(_metrics, _guard, sideways, [this](std::size_t column) {
-            pressHeading(_model, column);
+    // The headings may be made again: not while one of them calls.
+    const auto changing = [this](auto change) {
+        return [this, change](auto... column) {
+            change(column...);
             later(&TableView::columnsChanged);
-        });
+        };
+    };
+    _headings = std::make_unique<TableHeadings>(
+        _metrics, _guard, sideways,
+        TableHeadings::Actions{
+            .press = changing([this](std::size_t column) { pressHeading(_model, column); }),
+            .hide = changing([this](std::size_t column) { _model.hide(column); }),
+            .showAll = changing([this] { _model.showAllColumns(); })});
     gtk_box_append(_box.get(), _headings->widget());
     gtk_box_append(_box.get(), GTK_WIDGET(_scroller));
     gtk_widget_set_vexpand(widget(), TRUE);

@@ -48,6 +48,7 @@ public:
     void show(const State& state);
     /// Lets the user type a place.
     void focusPlace() { gtk_widget_grab_focus(GTK_WIDGET(_place)); }
+    void clearPlace() { gtk_editable_set_text(GTK_EDITABLE(_place), ""); }
     GtkWidget* widget() const { return GTK_WIDGET(_box.get()); }
 
 private:

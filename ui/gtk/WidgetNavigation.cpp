@@ -165,6 +165,15 @@ void WidgetNavigation::back() {
     }
 }
 
+std::optional<std::string> WidgetNavigation::focusedValue() const {
+    for (const auto& screen : _screens) {
+        if (auto path = widgetTable(screen->table()).focusedValue()) {
+            return path;
+        }
+    }
+    return std::nullopt;
+}
+
 void WidgetNavigation::show(ui::TableScreen& screen, bool animated) {
     if (_delegate != nullptr) {
         _delegate->navigationControllerWillShow(*this, screen, animated);

@@ -8,6 +8,8 @@
 #include <cstddef>
 #include <functional>
 #include <memory>
+#include <optional>
+#include <string>
 #include <vector>
 
 namespace pallax::gtk {
@@ -45,6 +47,8 @@ public:
     bool isAtRoot() const { return _screens.size() == 1; }
     /// One pane back; does nothing at the root.
     void back();
+    /// As WidgetTable, of any pane that is seen.
+    std::optional<std::string> focusedValue() const;
     bool isToolbarShown() const { return _isToolbarShown; }
     const std::shared_ptr<ui::ModalScreen>& modal() const { return _modal; }
     /// Whether the root pane stands beside the topmost one.

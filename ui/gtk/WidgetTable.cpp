@@ -261,6 +261,23 @@ bool WidgetTable::hasFocus(const Bound& bound) {
     return row != nullptr && gtk_widget_has_focus(row) != 0;
 }
 
+std::optional<std::size_t> WidgetTable::focusedRow() const {
+    for (const auto& [item, bound] : _bound) {
+        if (const guint shown = gtk_list_item_get_position(item);
+            hasFocus(bound) && shown < pane().shownRows()) {
+            return pane().rowAt(shown);
+        }
+    }
+    return std::nullopt;
+}
+
+std::optional<std::string> WidgetTable::focusedValue() const {
+    const auto row = focusedRow();
+    const NodeRef node = row ? pane().nodeAt(*row) : nullptr;
+    const bool isValue = node != nullptr && node->childNodes() == nullptr;
+    return isValue ? std::optional(childPath(pane().path(), node->displayName())) : std::nullopt;
+}
+
 /// The keys that scroll the row with the focus sideways.
 gboolean WidgetTable::handleKey(guint key) {
     constexpr double kStep = 40; // points

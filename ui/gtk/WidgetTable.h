@@ -56,6 +56,11 @@ public:
     /// Whether the pane shows a list that can be a table with columns, and whether it is one.
     bool isListWithColumns() const;
     bool isShownAsTable() const { return isListWithColumns() && _look->asTables; }
+    /// The row of the source under the keyboard or, if that is elsewhere, the one that was selected
+    /// last.
+    std::optional<std::size_t> cursorRow() const;
+    /// The path in the display of the row under the keyboard; nothing unless it shows a value.
+    std::optional<std::string> focusedValue() const;
     /// Shows lists as tables, or as rows again. The cursor stays on its entry.
     void switchLook();
     /// Brings a row of the source into view, and the keyboard to it. Clears the filter if it hides
@@ -93,6 +98,7 @@ private:
     void remember(const Bound& bound, double offset);
     void widthChanged();
     static bool hasFocus(const Bound& bound);
+    std::optional<std::size_t> focusedRow() const;
     void focusRow(const std::string& name);
     /// Runs a block later, unless the table is gone by then.
     void later(void (WidgetTable::*action)());

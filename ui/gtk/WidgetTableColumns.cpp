@@ -33,10 +33,17 @@ void WidgetTable::refreshTable() {
     }
 }
 
+std::optional<std::size_t> WidgetTable::cursorRow() const {
+    if (isShownAsTable() && _columns != nullptr) {
+        return _columns->model().cursorRow();
+    }
+    const auto focused = focusedRow();
+    return focused ? focused : pane().cursorRow();
+}
+
 void WidgetTable::switchLook() {
     const bool wasTable = isShownAsTable();
-    const auto row =
-        wasTable && _columns != nullptr ? _columns->model().cursorRow() : pane().cursorRow();
+    const auto row = cursorRow();
     setFilter("");
     _look->asTables = !wasTable;
     reloadData();
@@ -74,9 +81,11 @@ void WidgetTable::select(std::size_t row) {
 /// Before the list has its size, it cannot scroll to a row.
 void WidgetTable::focusWanted() {
     GtkAdjustment* vertical = gtk_scrolled_window_get_vadjustment(_scroller);
-    if (_wanted && gtk_adjustment_get_page_size(vertical) > 0) {
+    GtkRoot* const root = gtk_widget_get_root(GTK_WIDGET(_list));
+    if (_wanted && root != nullptr && gtk_adjustment_get_page_size(vertical) > 0) {
         gtk_widget_activate_action(GTK_WIDGET(_list), "list.scroll-to-item", "u",
                                    static_cast<guint>(pane().cursor()));
+        gtk_window_set_focus_visible(GTK_WINDOW(root), TRUE);
         focusRow(*std::exchange(_wanted, std::nullopt));
     }
 }

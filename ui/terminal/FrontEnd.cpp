@@ -21,7 +21,8 @@ FrontEnd::FrontEnd(Surroundings surroundings, const Marks& marks)
       _time({_surroundings.travel, _toolkit,
              [this](std::string text) { setMessage(std::move(text)); },
              [this] { needsDisplay(); }}),
-      _shown(_surroundings.valueSource()), _finder(finderSurroundings()) {
+      _shown(_surroundings.valueSource()), _finder(finderSurroundings()),
+      _hitWalk(hitWalkSurroundings()) {
     _toolkit.lists().partAt = _surroundings.entryPart;
     _toolkit.lists().ageAt = [this](const std::string& path) {
         _shown.update();
@@ -134,7 +135,7 @@ void FrontEnd::setSafe(bool isSafe) {
     forgetTimeline();
     _pages = {};
     _graph = {};
-    _search.reset();
+    _hitWalk.forget();
     _filterEditor.reset();
     if (TerminalTable* const pane = table()) {
         pane->setFilter("");

@@ -2,6 +2,7 @@
 
 #include "timeline/Moment.h"
 #include "ui/contents/Graph.h"
+#include "ui/contents/HitWalk.h"
 #include "ui/contents/ShownValues.h"
 #include "ui/contents/TextFinder.h"
 #include "ui/drawing/Grid.h"
@@ -117,13 +118,6 @@ public:
     void turn();
 
 private:
-    /// What was searched last.
-    struct Search {
-        std::string text;
-        SearchScope scope;
-        std::size_t conditions; ///< how many there were
-    };
-
     void needsDisplay();
     void drawScreen(Grid& grid, TerminalNavigation& navigation);
     void handleMouse(const KeyEvent& event);
@@ -153,12 +147,9 @@ private:
     /// In the characters of the terminal.
     Wording wording() const;
     PageTable::Copy copier();
-    std::size_t conditions() const;
-    void noteSearch(const std::string& text, SearchScope scope);
+    HitWalk::Surroundings hitWalkSurroundings();
     void goToPlace(const std::vector<std::size_t>& place);
     bool findAgain(const KeyEvent& event);
-    void findRowAgain(bool isForward);
-    void findInstantAgain(bool isForward);
     std::string_view standingOfRow(const std::string& path);
     std::string curveOfRow(const std::string& path, int columns);
     Overview overviewWithCurves();
@@ -184,7 +175,7 @@ private:
     ShownValues _shown;
     Graph _graph;
     TextFinder _finder;
-    std::optional<Search> _search; ///< the latest from which the user went to a hit
+    HitWalk _hitWalk;
     bool _isPaneWanted =
         false; ///< the page that handles a key went to a row: no page is to be left
     Pages _pages;

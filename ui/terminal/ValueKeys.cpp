@@ -1,5 +1,6 @@
 #include "fields/Measures.h"
 #include "overview/ValueFacts.h"
+#include "ui/contents/GraphContent.h"
 #include "ui/terminal/FrontEnd.h"
 
 #include <chrono>
@@ -78,17 +79,12 @@ void FrontEnd::handleValueKey(char32_t character) {
     }
     auto leaf = leafAtCursor();
     if (!leaf) {
-        return setMessage("Nothing to show here: choose a value.");
+        return setMessage(kNoValueHere);
     }
     if (character == U'i') {
         return openValue(std::move(*leaf));
     }
-    _shown.update();
-    const auto name =
-        _shown.values() != nullptr ? leafAt(*_shown.values(), leaf->path) : std::nullopt;
-    const auto value = name ? valueOf(*_shown.values(), *name) : std::nullopt;
-    const bool isNumber = value && name->inner.empty() && std::isfinite(value->value.number);
-    setMessage(isNumber ? _graph.toggle(*name) : "Only numbers have a curve.");
+    setMessage(toggleInGraph(_graph, _shown, leaf->path));
 }
 
 std::string_view FrontEnd::standingOfRow(const std::string& path) {

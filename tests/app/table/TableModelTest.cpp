@@ -112,6 +112,17 @@ TEST_F(TableModelTest, BeforeTheFirstColumnIsTheOrderOfTheContent) {
     EXPECT_EQ(model.chosenColumn(), 2U);
 }
 
+TEST_F(TableModelTest, HidesAnyColumn) {
+    model.choose(2);
+    model.hide(0);
+    EXPECT_EQ(model.columns(), (std::vector<std::size_t>{1, 2}));
+    EXPECT_EQ(model.chosenColumn(), 2U) << "another one";
+    model.hide(2);
+    EXPECT_EQ(model.chosenColumn(), 1U) << "its neighbour";
+    model.hide(1);
+    EXPECT_EQ(model.columns(), (std::vector<std::size_t>{1})) << "the last one stays";
+}
+
 TEST_F(TableModelTest, HidesTheChosenColumnAndChoosesItsNeighbour) {
     model.hideChosen(); // none is chosen
     EXPECT_FALSE(model.hidesColumns());

@@ -41,6 +41,20 @@ TEST_F(GraphContentTest, HasAPlotForEachUnitAndALetterForEachCurve) {
     EXPECT_EQ(graphWords(drive.shown, reading), "the last 5 minutes");
 }
 
+TEST_F(GraphContentTest, AValueOfTheDisplayIsAddedAndTakenAway) {
+    const auto toggle = [this](const char* path) {
+        return toggleInGraph(graph, drive.shown, path);
+    };
+    EXPECT_EQ(toggle("/Serving Cell Measurements/Measured RSSI"),
+              "In the graph (5 of 6): V opens it.");
+    EXPECT_TRUE(graph.contains({"lte.serving_cell_measurements.measured_rssi", "", ""}));
+    EXPECT_EQ(toggle("/Serving Cell Measurements/Measured RSSI"), "No longer in the graph.");
+    EXPECT_EQ(toggle("/SIM Info/EF-ICCID"), "Only numbers have a curve.");
+    EXPECT_EQ(toggle("/Nothing"), "Only numbers have a curve.");
+    drive.moment = {};
+    EXPECT_EQ(toggle("/Serving Cell Measurements/Measured RSSI"), "Only numbers have a curve.");
+}
+
 TEST_F(GraphContentTest, TheCursorReadsAllCurves) {
     (void)plots();
     const CurveWindow window = drive.shown.window();

@@ -10,7 +10,7 @@ class ChangesViewTest : public DisplayTest {};
 
 /// A window with what is tested.
 struct ChangesViewStage {
-    ~ChangesViewStage() { stage.frame.closePage(); }
+    ~ChangesViewStage() { stage.frame.pages().close(); }
     std::string dump() {
         stage.settle();
         return stage.dump();
@@ -21,7 +21,7 @@ struct ChangesViewStage {
 
 TEST_F(ChangesViewTest, SectionsHaveTheirLinesBelowThem) {
     ChangesViewStage tested;
-    tested.stage.frame.openPage(tested.view.widget(), "Changes");
+    tested.stage.frame.pages().open(tested.view.widget(), "Changes");
     tested.view.show("Changes from 22:14:20 to 22:14:50",
                      {"Measurements", "  RSRP  -77 dBm → -81 dBm", "  RSRQ  -5 dB → -6 dB", "",
                       "Neighbours", "  1 is new"});
@@ -48,7 +48,7 @@ text: Nothing differs.
 
 TEST_F(ChangesViewTest, TheSameContentAgainChangesNothing) {
     ChangesViewStage tested;
-    tested.stage.frame.openPage(tested.view.widget(), "Changes");
+    tested.stage.frame.pages().open(tested.view.widget(), "Changes");
     tested.view.show("Changes", {"Measurements", "  RSRP"});
     GtkWidget* label = WindowStage::below(tested.view.widget(), GTK_TYPE_LABEL);
     tested.view.show("Changes", {"Measurements", "  RSRP"});

@@ -17,10 +17,10 @@ class CurvePlotTest : public DisplayTest {};
 struct CurvePlotStage {
     void open() {
         plot.show(samplePlot(), "Curve: something");
-        stage.frame.openPage(plot.widget(), "RSRP");
+        stage.frame.pages().open(plot.widget(), "RSRP");
         stage.settle();
     }
-    ~CurvePlotStage() { stage.frame.closePage(); }
+    ~CurvePlotStage() { stage.frame.pages().close(); }
 
     WindowStage stage{360, 720};
     std::vector<std::optional<Time>> pointed;

@@ -13,7 +13,7 @@ class GraphViewTest : public DisplayTest {};
 struct GraphViewStage {
     void show(const GraphView::Content& content) {
         view.show(content);
-        stage.frame.openPage(view.widget(), "Graph");
+        stage.frame.pages().open(view.widget(), "Graph");
         stage.settle();
     }
     static GraphView::Content content() {
@@ -23,7 +23,7 @@ struct GraphViewStage {
         ratios.content.lines = {{"b", 1, sampleCurve()}};
         return {.span = 2, .plots = {levels, ratios}, .words = "the last 5 minutes"};
     }
-    ~GraphViewStage() { stage.frame.closePage(); }
+    ~GraphViewStage() { stage.frame.pages().close(); }
 
     WindowStage stage{360, 720};
     std::vector<std::size_t> spans;

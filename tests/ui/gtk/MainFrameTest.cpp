@@ -52,17 +52,6 @@ button: Close (focus)
     EXPECT_EQ(stage.closings, 1);
 }
 
-TEST_F(MainFrameTest, AMessageDoesNotWidenTheWindow) {
-    WindowStage stage(360, 720);
-    stage.tick(terminal::display());
-    stage.frame.setMessage("Recorded " + std::string(100, 'w') + ".pcapng");
-    stage.settle();
-    int least = 0;
-    gtk_widget_measure(stage.window(), GTK_ORIENTATION_HORIZONTAL, -1, &least, nullptr, nullptr,
-                       nullptr);
-    EXPECT_LE(least, 360);
-}
-
 TEST_F(MainFrameTest, TheSearchShowsRowsThatContainTheText) {
     WindowStage stage(360, 720);
     stage.tick(terminal::display());

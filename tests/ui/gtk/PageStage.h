@@ -24,7 +24,7 @@ protected:
         moment = {drive->timeline.get(), drive->timeline->packets()};
     }
     void show(GtkWidget* page, const char* title) {
-        stage->frame.openPage(page, title);
+        stage->frame.pages().open(page, title);
         settle();
     }
     void settle() {
@@ -34,7 +34,7 @@ protected:
     }
     void TearDown() override {
         if (stage != nullptr) {
-            stage->frame.closePage();
+            stage->frame.pages().close();
             stage->settle();
         }
     }

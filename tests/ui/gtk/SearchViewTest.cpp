@@ -27,7 +27,7 @@ protected:
                 .close =
                     [this] {
                         ++closings;
-                        stage->frame.closePage();
+                        stage->frame.pages().close();
                     }});
         show(view->widget(), "Find a Text");
         view->focus();

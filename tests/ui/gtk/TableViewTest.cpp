@@ -20,13 +20,13 @@ protected:
         });
         view->model().show(cells());
         view->refresh();
-        stage->frame.openPage(view->widget(), "Cells");
+        stage->frame.pages().open(view->widget(), "Cells");
         stage->settle();
         stage->settle();
     }
     void TearDown() override {
         if (stage != nullptr) {
-            stage->frame.closePage();
+            stage->frame.pages().close();
             stage->settle();
         }
         view = nullptr;
@@ -62,6 +62,33 @@ protected:
         g_signal_emit_by_name(keys.get(), "key-pressed", key, 0U, state, &isTaken);
         taken = isTaken != FALSE;
         stage->settle();
+    }
+    /// Recognizes a gesture on a heading.
+    void gesture(const char* heading, GType type, const std::function<void(GObject*)>& recognize) {
+        GtkWidget* button = WindowStage::found(stage->window(), [&](GtkWidget* each) {
+            const char* name = gtk_widget_get_tooltip_text(each);
+            return name != nullptr && std::string(name) == heading;
+        });
+        ASSERT_NE(button, nullptr) << heading;
+        const Ref<GListModel> controllers(gtk_widget_observe_controllers(button));
+        for (guint index = 0; index < g_list_model_get_n_items(controllers.get()); ++index) {
+            const Ref<GObject> each(G_OBJECT(g_list_model_get_item(controllers.get(), index)));
+            const bool isPrimary =
+                GTK_IS_GESTURE_CLICK(each.get()) != FALSE &&
+                gtk_gesture_single_get_button(GTK_GESTURE_SINGLE(each.get())) == GDK_BUTTON_PRIMARY;
+            if (G_OBJECT_TYPE(each.get()) == type && !isPrimary) {
+                recognize(each.get());
+            }
+        }
+        stage->settle();
+    }
+    void pressLong(const char* heading) {
+        gesture(heading, GTK_TYPE_GESTURE_LONG_PRESS,
+                [](GObject* each) { g_signal_emit_by_name(each, "pressed", 1.0, 1.0); });
+    }
+    void pressOther(const char* heading) {
+        gesture(heading, GTK_TYPE_GESTURE_CLICK,
+                [](GObject* each) { g_signal_emit_by_name(each, "pressed", 1, 1.0, 1.0); });
     }
     void activate(guint row) {
         g_signal_emit_by_name(WindowStage::below(view->widget(), GTK_TYPE_LIST_VIEW), "activate",
@@ -159,6 +186,45 @@ TEST_F(TableViewTest, TheKeysOfTablesOnATerminalWork) {
         press(GDK_KEY_less);
     }
     EXPECT_EQ(dump().find("sorted"), std::string::npos);
+}
+
+TEST_F(TableViewTest, AHeadingHasAMenuThatHidesItsColumnAndShowsAll) {
+    open(1024, 768);
+    TableContent aged = cells();
+    aged.columns.push_back({"age", {}, false, true});
+    for (TableRow& row : aged.rows) {
+        row.cells.push_back({"2 s"});
+    }
+    update(aged, TableModel::Changes::Ignore);
+    EXPECT_EQ(dump(), kWide);
+    pressLong("State, in the words of the record");
+    stage->press("Hide Column");
+    EXPECT_EQ(
+        dump().substr(0, dump().find("cells")),
+        "\ncolumns: Physical Cell ID (right) | Measured RSRP dBm (right) | Antennas (right)\n");
+    pressOther("Antennas");
+    stage->press("Show All Columns");
+    EXPECT_EQ(
+        dump().substr(0, dump().find("cells")),
+        "\ncolumns: Physical Cell ID (right) | Measured RSRP dBm (right) | State, in the words "
+        "of the record | Antennas (right) | age\n");
+}
+
+TEST_F(TableViewTest, AMenuThatIsOpenGoesWithItsHeading) {
+    open(1024, 768);
+    pressLong("Antennas");
+    GtkWidget* const found = WindowStage::below(stage->window(), GTK_TYPE_POPOVER);
+    ASSERT_NE(found, nullptr);
+    const Ref<GtkWidget> menu = shared(found);
+    TableContent fewer = cells();
+    fewer.columns.pop_back();
+    for (TableRow& row : fewer.rows) {
+        row.cells.pop_back();
+    }
+    update(fewer);
+    EXPECT_EQ(gtk_widget_get_parent(menu.get()), nullptr);
+    pressLong("Measured RSRP dBm");
+    EXPECT_NE(WindowStage::below(stage->window(), GTK_TYPE_POPOVER), nullptr);
 }
 
 TEST_F(TableViewTest, ChangedCellsAreMarkedUntilTheNextRefresh) {

@@ -22,10 +22,10 @@ struct ValueViewStage {
     }
     void open(const ValueView::Content& shown) {
         view.show(shown);
-        stage.frame.openPage(view.widget(), "RSRP");
+        stage.frame.pages().open(view.widget(), "RSRP");
         stage.settle();
     }
-    ~ValueViewStage() { stage.frame.closePage(); }
+    ~ValueViewStage() { stage.frame.pages().close(); }
 
     WindowStage stage{360, 720};
     std::vector<std::string> done;
@@ -61,11 +61,11 @@ TEST_F(ValueViewTest, IsAPageOverThePanesUntilTheUserGoesBack) {
     const std::string panes = tested.stage.dump();
     tested.open(tested.content());
     EXPECT_EQ(tested.stage.dump(), kValuePage);
-    EXPECT_TRUE(tested.stage.frame.isPageOpen());
+    EXPECT_TRUE(tested.stage.frame.pages().isOpen());
     tested.stage.press("Back");
-    EXPECT_FALSE(tested.stage.frame.isPageOpen());
+    EXPECT_FALSE(tested.stage.frame.pages().isOpen());
     EXPECT_EQ(tested.stage.dump(), panes);
-    tested.stage.frame.openPage(tested.view.widget(), "RSRP"); // again
+    tested.stage.frame.pages().open(tested.view.widget(), "RSRP"); // again
     tested.stage.settle();
     EXPECT_NE(tested.stage.dump().find("A sentence."), std::string::npos);
 }

@@ -108,6 +108,33 @@ TEST_F(WidgetTableRows, TheFocusStaysOnItsRowWhenAnotherComesAboveIt) {
     EXPECT_EQ(nameOf(focus), "B");
 }
 
+TEST_F(WidgetTableRows, TheCursorIsOnTheRowWithTheKeyboardOrThatWasSelectedLast) {
+    WindowStage stage(360, 400);
+    stage.tick(Dictionary{{"A", "1"}, {"B", "1"}, {"C", "1"}});
+    EXPECT_EQ(stage.table().cursorRow(), 0U);
+    gtk_widget_grab_focus(rowWidget(stage, 1));
+    EXPECT_EQ(stage.table().cursorRow(), 1U);
+    stage.select(2);
+    gtk_window_set_focus(stage.frame.window(), nullptr);
+    EXPECT_EQ(stage.table().cursorRow(), 2U);
+    stage.table().select(0);
+    EXPECT_EQ(stage.table().cursorRow(), 0U);
+}
+
+TEST_F(WidgetTableRows, TellsTheValueUnderTheKeyboard) {
+    WindowStage stage(360, 400);
+    stage.tick(Dictionary{{"A", "1"}, {"Cell", Dictionary{{"RSRP", "-94 dBm"}}}});
+    gtk_window_set_focus(stage.frame.window(), nullptr);
+    EXPECT_EQ(stage.frame.shownStack()->focusedValue(), std::nullopt);
+    gtk_widget_grab_focus(rowWidget(stage, 0));
+    EXPECT_EQ(stage.frame.shownStack()->focusedValue(), "/A");
+    gtk_widget_grab_focus(rowWidget(stage, 1));
+    EXPECT_EQ(stage.frame.shownStack()->focusedValue(), std::nullopt) << "a pane";
+    stage.select(1);
+    gtk_widget_grab_focus(rowWidget(stage, 0));
+    EXPECT_EQ(stage.frame.shownStack()->focusedValue(), "/Cell/RSRP");
+}
+
 TEST_F(WidgetTableRows, WhatHasChangedIsMarkedForOneTick) {
     WindowStage stage(360, 400);
     stage.tick(Dictionary{{"A", "1"}});

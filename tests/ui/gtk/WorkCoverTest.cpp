@@ -96,14 +96,14 @@ TEST_F(WorkCoverTest, NoOtherKeyDoesAnything) {
 TEST_F(WorkCoverTest, AnOpenPageIsThereAgainAfterwards) {
     WorkCoverStage tested;
     const Ref<GtkWidget> label = owned(gtk_label_new("a value"));
-    tested.stage.frame.openPage(label.get(), "RSRP");
+    tested.stage.frame.pages().open(label.get(), "RSRP");
     tested.stage.settle();
     const std::string page = tested.stage.dump();
     tested.work("Working.");
     tested.stage.frame.endWork();
     tested.stage.settle();
     EXPECT_EQ(tested.stage.dump(), page);
-    tested.stage.frame.closePage();
+    tested.stage.frame.pages().close();
 }
 
 } // namespace
