@@ -60,7 +60,7 @@ void TimeBar::buildButtons(GtkBox* to) {
 
 void TimeBar::buildPlace() {
     _place = GTK_ENTRY(gtk_entry_new());
-    gtk_entry_set_placeholder_text(_place, translated("14:03, +90s, or rsrp < -110"));
+    gtk_entry_set_placeholder_text(_place, "14:03, +90s, measured_rsrp < -110");
     nameWidget(GTK_WIDGET(_place),
                translated("Go to a time, or to where a condition becomes true"));
     onSignal(_place, "activate", _guard,

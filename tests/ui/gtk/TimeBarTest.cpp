@@ -58,6 +58,8 @@ TEST_F(TimeBarTest, APlaceThatIsTypedIsGoneTo) {
     gtk_editable_set_text(GTK_EDITABLE(entry), "+90s");
     g_signal_emit_by_name(entry, "activate");
     EXPECT_EQ(place, "+90s");
+    EXPECT_STREQ(gtk_entry_get_placeholder_text(GTK_ENTRY(entry)),
+                 "14:03, +90s, measured_rsrp < -110");
 }
 
 } // namespace
