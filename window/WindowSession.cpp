@@ -122,7 +122,15 @@ gtk::TimeBar::Actions WindowSession::timeActions() {
 
 /// Outside the toolkit's frames, because a search may take long.
 void WindowSession::goTo(const std::string& place) {
-    _work.begin([this, place] { travel([&place](Travel& to) { return to.goTo(place); }); });
+    _work.begin([this, place] {
+        travel([this, &place](Travel& to) {
+            Travel::Refusal refusal = to.goTo(place);
+            if (!refusal) {
+                _timeBar.leavePlace(); // one that is refused can be mended
+            }
+            return refusal;
+        });
+    });
 }
 
 void WindowSession::findAgain(Direction direction) {

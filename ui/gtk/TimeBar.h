@@ -48,6 +48,8 @@ public:
     void show(const State& state);
     /// Lets the user type a place.
     void focusPlace() { gtk_widget_grab_focus(GTK_WIDGET(_place)); }
+    /// If the user was typing one, the keys are the window's again.
+    void leavePlace();
     GtkWidget* widget() const { return GTK_WIDGET(_box.get()); }
 
 private:
