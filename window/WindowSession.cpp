@@ -55,6 +55,7 @@ WindowSession::WindowSession(Setup setup)
     _viewer.attach(_toolkit);
     _frame.onLeaf([this](const auto& path, const auto& text) { _pages.openValue(path, text); });
     _frame.pages().onUncovered([this] { showPage(); });
+    _overview.showWhenSeen(setup.guard, [this] { return _viewer.overview(); });
     _frame.setDetail(_overview.widget(), gtk::translated("Overview"));
     if (setup.request.settings.firstScreen == FirstScreen::Overview) {
         _frame.toggleDetail();

@@ -136,6 +136,15 @@ TEST_F(EndToEndWindow, WhatDiffersFromTheMarkIsAPage) {
               "key [ has 'Changes from 22:15:19 to 22:15:*' key Escape lacks 'Changes from *'"));
 }
 
+TEST_F(EndToEndWindow, AfterAPlaceIsReachedTheKeysAreTheWindowsAgain) {
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' key : "
+                       "type 'Go to a time, or to where a condition becomes true=rsrp < -95' "
+                       "key Return has 'no such column: rsrp.*' "
+                       "type 'Go to a time, or to where a condition becomes true=22:14:00' "
+                       "key Return has '22:14:00, held*' key m has 'Marked 22:14:00*'"));
+}
+
 TEST_F(EndToEndWindow, ALongSearchTellsHowFarItIsAndIsCancelled) {
     std::vector<Packet> packets;
     for (int number = 0; number < 100000; ++number) {

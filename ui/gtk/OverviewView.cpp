@@ -39,6 +39,17 @@ OverviewView::OverviewView()
     show({});
 }
 
+OverviewView::~OverviewView() {
+    if (_seen != 0) { // the page may outlive the view
+        g_signal_handler_disconnect(widget(), _seen);
+    }
+}
+
+void OverviewView::showWhenSeen(const Guard& guard, std::function<Overview()> latest) {
+    _seen =
+        onSignal(widget(), "map", guard, [this, latest = std::move(latest)] { show(latest()); });
+}
+
 /// Widgets stay, so that the place on the page and the focus do, too: making them takes much longer
 /// than changing their texts. Those that are not needed now are hidden.
 void OverviewView::show(const Overview& overview) {

@@ -2,8 +2,10 @@
 
 #include "overview/StatusWatch.h"
 #include "ui/gtk/Ref.h"
+#include "ui/gtk/Signals.h"
 
 #include <adwaita.h>
+#include <functional>
 #include <optional>
 #include <string>
 #include <vector>
@@ -17,8 +19,11 @@ public:
     OverviewView();
     OverviewView(const OverviewView&) = delete;
     OverviewView& operator=(const OverviewView&) = delete;
+    ~OverviewView();
 
     void show(const Overview& overview);
+    /// Shows the latest overview whenever the page comes into view: what it showed before is old.
+    void showWhenSeen(const Guard& guard, std::function<Overview()> latest);
     GtkWidget* widget() const { return GTK_WIDGET(_page.get()); }
 
 private:
@@ -52,6 +57,7 @@ private:
     static void fill(RowWidgets& widgets, const Row& row);
 
     Ref<GtkBox> _page;
+    gulong _seen = 0;    ///< the handler, if any
     GtkWidget* _nothing; ///< words that nothing is known; the page owns it and what follows
     GtkWidget* _groupsPage;
     std::vector<GroupWidgets> _groups; ///< as many as were ever needed

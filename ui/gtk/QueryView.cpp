@@ -80,7 +80,7 @@ void QueryView::open() {
 std::string QueryView::sentence() const {
     switch (_content.state()) {
     case QueryState::NotAsked:
-        return translated("Ask in SQL; the table named tables lists them.");
+        return translated("Ask in SQL: select * from tables lists the tables.");
     case QueryState::NothingToAsk:
         return translated("There is nothing to ask yet: no packet has come.");
     case QueryState::Running:

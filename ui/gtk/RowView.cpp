@@ -150,8 +150,8 @@ bool RowView::isSame(const Shown& shown, const Shown& other) {
     const auto extent = [](const Shown& of) {
         return of.container ? of.container->contentSize : ui::Size();
     };
-    return shown.scale == other.scale && shown.accessory == other.accessory &&
-           shown.notes == other.notes &&
+    return shown.scale == other.scale && shown.area == other.area &&
+           shown.accessory == other.accessory && shown.notes == other.notes &&
            shown.container.has_value() == other.container.has_value() &&
            extent(shown) == extent(other) &&
            std::equal(shown.labels.begin(), shown.labels.end(), other.labels.begin(),
@@ -162,6 +162,7 @@ void RowView::fill(const ui::TableCell& cell, const RowNotes& notes) {
     const ui::CellContents contents = cell.contents();
     Shown wanted{.labels = {},
                  .container = {},
+                 .area = {},
                  .accessory = cell.accessory(),
                  .notes = notes,
                  .scale = _metrics.scale()};
@@ -170,15 +171,16 @@ void RowView::fill(const ui::TableCell& cell, const RowNotes& notes) {
     }
     if (contents.container != nullptr) {
         wanted.container = *contents.container;
+    } else {
+        wanted.area = cell.contentBounds();
     }
     if (isSame(_shown, wanted)) {
         return;
     }
     _shown = std::move(wanted);
     const ui::ScrollContainer* container = contents.container;
-    const ui::Rect area = container != nullptr ? ui::Rect() : cell.contentBounds();
     for (std::size_t index = 0; index < contents.labels.size(); ++index) {
-        place(labelAt(index), *contents.labels[index], area,
+        place(labelAt(index), *contents.labels[index], _shown.area,
               notes.hasChanged && index + 1 == contents.labels.size());
     }
     for (std::size_t index = contents.labels.size(); index < _labels.size(); ++index) {

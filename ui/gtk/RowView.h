@@ -58,6 +58,7 @@ private:
     struct Shown {
         std::vector<ui::Label> labels;
         std::optional<ui::ScrollContainer> container;
+        ui::Rect area; ///< where a cell that does not scroll cuts its texts
         ui::CellAccessory accessory = ui::CellAccessory::None;
         RowNotes notes;
         double scale = 0;

@@ -68,8 +68,10 @@ void SearchView::refresh() {
     _page.show(sentence());
 }
 
+/// What is typed replaces the text before.
 void SearchView::focus() {
     gtk_widget_grab_focus(GTK_WIDGET(_field));
+    gtk_editable_select_region(GTK_EDITABLE(_field), 0, -1);
 }
 
 void SearchView::open() {

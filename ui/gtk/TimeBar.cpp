@@ -60,11 +60,21 @@ void TimeBar::buildButtons(GtkBox* to) {
 
 void TimeBar::buildPlace() {
     _place = GTK_ENTRY(gtk_entry_new());
-    gtk_entry_set_placeholder_text(_place, translated("14:03, +90s, or rsrp < -110"));
+    gtk_entry_set_placeholder_text(_place, "14:03, +90s, measured_rsrp < -110");
     nameWidget(GTK_WIDGET(_place),
                translated("Go to a time, or to where a condition becomes true"));
     onSignal(_place, "activate", _guard,
              [this] { _actions.goTo(gtk_editable_get_text(GTK_EDITABLE(_place))); });
+    GtkEventController* keys = gtk_event_controller_key_new();
+    gtk_event_controller_set_propagation_phase(keys, GTK_PHASE_CAPTURE);
+    const auto pressed = [this](guint key) -> gboolean {
+        if (key == GDK_KEY_Escape) {
+            leavePlace();
+        }
+        return key == GDK_KEY_Escape ? TRUE : FALSE;
+    };
+    connect(keys, "key-pressed", _guard, std::function<gboolean(guint)>(pressed));
+    gtk_widget_add_controller(GTK_WIDGET(_place), keys);
     gtk_widget_set_hexpand(GTK_WIDGET(_place), TRUE);
     auto* row = GTK_BOX(gtk_box_new(GTK_ORIENTATION_HORIZONTAL, kGap));
     gtk_box_append(row, GTK_WIDGET(_place));
@@ -72,6 +82,13 @@ void TimeBar::buildPlace() {
     _changes = addButton(row, "view-dual-symbolic", translated("Changes since the Mark"),
                          Wish::ShowChanges);
     gtk_box_append(_box.get(), GTK_WIDGET(row));
+}
+
+/// Whatever has the focus in its place, the on-screen keyboard goes away.
+void TimeBar::leavePlace() {
+    if (gtk_widget_get_focus_child(widget()) != nullptr) {
+        gtk_root_set_focus(gtk_widget_get_root(widget()), nullptr);
+    }
 }
 
 /// Events above the scale, the marked instant below it.

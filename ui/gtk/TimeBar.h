@@ -56,6 +56,7 @@ private:
     void buildButtons(GtkBox* to);
     void buildPlace();
     void showMarks(const State& state);
+    void leavePlace();
 
     Guard _guard;
     Actions _actions;

@@ -88,6 +88,30 @@ TEST_F(OverviewViewTest, WithoutAnythingKnownThereAreWords) {
         << stage.dump();
 }
 
+TEST_F(OverviewViewTest, WhatIsSeenIsTheLatestFromTheFirstFrame) {
+    WindowStage stage(360, 720);
+    OverviewView view;
+    Overview latest = overview();
+    int asked = 0;
+    view.showWhenSeen(stage.guard, [&] {
+        ++asked;
+        return latest;
+    });
+    stage.frame.setDetail(view.widget(), "Overview");
+    stage.settle();
+    EXPECT_EQ(asked, 0) << "on a phone it is hidden";
+    stage.frame.toggleDetail();
+    stage.settle();
+    EXPECT_NE(stage.dump().find("text: -92.25 dBm\n"), std::string::npos) << stage.dump();
+    stage.frame.toggleDetail();
+    stage.settle();
+    latest.status.cells[0].levels[0].text = "-80.00 dBm";
+    stage.frame.toggleDetail();
+    stage.settle();
+    EXPECT_NE(stage.dump().find("text: -80.00 dBm\n"), std::string::npos) << stage.dump();
+    EXPECT_EQ(asked, 2);
+}
+
 TEST_F(OverviewViewTest, RowsStayWhenOnlyTheirTextsChange) {
     OverviewView view;
     Overview shown = overview();

@@ -46,10 +46,10 @@ TEST_F(QueryViewTest, BeginsWithAnEmptyFieldAndAnExplanation) {
 button: Back
 title: Ask in SQL / 
 field: ""
-text: Ask in SQL; the table named tables lists them.
+text: Ask in SQL: select * from tables lists the tables.
 )");
     ask("  ");
-    EXPECT_TRUE(shows("text: Ask in SQL;")) << "blanks ask nothing";
+    EXPECT_TRUE(shows("text: Ask in SQL:")) << "blanks ask nothing";
     ask("select 1");
     EXPECT_TRUE(shows("text: There is nothing to ask yet: no packet has come."));
 }

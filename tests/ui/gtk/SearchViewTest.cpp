@@ -132,6 +132,16 @@ TEST_F(SearchViewTest, WithoutATimelineThereIsNothingToSearch) {
     EXPECT_TRUE(shows("text: There is nothing to search yet: no packet has come."));
 }
 
+TEST_F(SearchViewTest, WhatIsTypedReplacesTheTextBefore) {
+    openSearch(kPhone);
+    find("rsrp");
+    view->focus();
+    int from = 0;
+    int to = 0;
+    EXPECT_TRUE(gtk_editable_get_selection_bounds(field(view->widget()), &from, &to));
+    EXPECT_EQ(to - from, 4) << "all of it is selected";
+}
+
 TEST_F(SearchViewTest, DownGoesToTheHitsAndEscapeGoesBack) {
     openSearch(kPhone);
     find("rsrp");

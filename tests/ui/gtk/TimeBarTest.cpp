@@ -58,6 +58,33 @@ TEST_F(TimeBarTest, APlaceThatIsTypedIsGoneTo) {
     gtk_editable_set_text(GTK_EDITABLE(entry), "+90s");
     g_signal_emit_by_name(entry, "activate");
     EXPECT_EQ(place, "+90s");
+    EXPECT_STREQ(gtk_entry_get_placeholder_text(GTK_ENTRY(entry)),
+                 "14:03, +90s, measured_rsrp < -110");
+}
+
+TEST_F(TimeBarTest, EscapeLeavesThePlace) {
+    WindowStage stage(360, 720);
+    TimeBar bar(stage.guard, {.wish = [](TimeBar::Wish) {},
+                              .toShare = [](double) {},
+                              .goTo = [](const std::string&) {}});
+    stage.frame.addBar(bar.widget());
+    const auto isInBar = [&] { return gtk_widget_get_focus_child(bar.widget()) != nullptr; };
+    bar.focusPlace();
+    stage.settle();
+    ASSERT_TRUE(isInBar());
+    const Ref<GListModel> controllers(
+        gtk_widget_observe_controllers(WindowStage::below(bar.widget(), GTK_TYPE_ENTRY)));
+    const Ref<GObject> keys(G_OBJECT(g_list_model_get_item(controllers.get(), 0)));
+    const auto press = [&](guint key) {
+        gboolean isTaken = FALSE;
+        g_signal_emit_by_name(keys.get(), "key-pressed", key, 0U, GdkModifierType(), &isTaken);
+        stage.settle();
+        return isTaken != FALSE;
+    };
+    EXPECT_FALSE(press(GDK_KEY_a));
+    EXPECT_TRUE(isInBar());
+    EXPECT_TRUE(press(GDK_KEY_Escape));
+    EXPECT_FALSE(isInBar());
 }
 
 } // namespace

@@ -164,6 +164,30 @@ TEST_F(WidgetTableRows, ARowThatStaysAsItIsIsLeftAlone) {
     EXPECT_STREQ(gtk_label_get_text(name()), "A");
 }
 
+TEST_F(WidgetTableRows, ANameThatIsCutIsShownInFullWhenThereIsRoom) {
+    const Dictionary display{
+        {"Connected mode LTE Intra-frequency Measurement", Dictionary{{"A", "1"}}}};
+    WindowStage stage(360, 400);
+    stage.tick(display);
+    const auto name = [&] {
+        return GTK_LABEL(WindowStage::found(rowWidget(stage, 0), [](GtkWidget* widget) {
+            return GTK_IS_LABEL(widget) && *gtk_label_get_text(GTK_LABEL(widget)) != '\0';
+        }));
+    };
+    const auto isCut = [&] {
+        return pango_layout_is_ellipsized(gtk_label_get_layout(name())) != FALSE;
+    };
+    EXPECT_TRUE(isCut());
+    stage.resize(1024, 400);
+    EXPECT_FALSE(isCut());
+    EXPECT_EQ(gtk_widget_get_tooltip_text(GTK_WIDGET(name())), nullptr);
+    stage.resize(360, 400);
+    EXPECT_TRUE(isCut());
+    EXPECT_EQ(gtk_adjustment_get_upper(sideways(stage)),
+              gtk_adjustment_get_page_size(sideways(stage)))
+        << "what ends in dots does not scroll";
+}
+
 TEST_F(WidgetTableRows, ScreenReadersHearNameAndValue) {
     WindowStage stage(360, 400);
     stage.tick(Dictionary{{"RSRP", "1"}, {"List", Array{Dictionary{}, Dictionary{}}}});
