@@ -73,7 +73,8 @@ TEST_F(EndToEndWindowSession, AStateIsReachedByACondition) {
 
 TEST_F(EndToEndWindowSession, AWordIsFoundInTheWholeRecording) {
     expectInUtranDrive("focus 'SIM Info' key f press 'Whole Recording' " + find("cell dch") +
-                       "open 'Time 22:13:29, Name State, Value Cell DCH*' has '22:13:30, held*'");
+                       "open 'Time 22:13:29, Name State, Value Cell DCH*' has '22:13:30, held*' "
+                       "key n lacks '22:13:30, held*'");
 }
 
 } // namespace
