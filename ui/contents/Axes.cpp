@@ -41,11 +41,13 @@ ValueAxis valueAxis(double least, double most, int count) {
     least = std::clamp(least, -kGreatest, kGreatest);
     most = std::clamp(most, least, kGreatest);
     count = std::max(count, 3); // two do not suffice around 0
-    if (least == most) {        // a flat line in the middle
+    // Channels and cells have no halves.
+    const bool areWhole = least == std::round(least) && most == std::round(most);
+    if (least == most) { // a flat line in the middle
         least -= 1;
         most += 1;
     }
-    double step = kSmallest;
+    double step = areWhole ? 1 : kSmallest;
     const auto first = [&] { return std::floor(least / step + kSmallest); };
     const auto last = [&] { return std::ceil(most / step - kSmallest); };
     while (last() - first() > count - 1 || first() + 1 == first()) {

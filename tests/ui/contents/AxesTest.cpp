@@ -45,6 +45,12 @@ TEST(ValueAxis, OfAValueThatDoesNotChangeHasItInTheMiddle) {
     EXPECT_EQ(labelsOf(0, 0, 3), "-1 0 1");
 }
 
+TEST(ValueAxis, BetweenWholeNumbersHasNoOthers) {
+    EXPECT_EQ(labelsOf(1850, 1850, 5), "1849 1850 1851");
+    EXPECT_EQ(labelsOf(182, 183, 9), "182 183");
+    EXPECT_EQ(labelsOf(-94.5, -94.5, 5), "-95.5 -95.0 -94.5 -94.0 -93.5");
+}
+
 TEST(ValueAxis, ContainsAnyNumbers) {
     for (const double most : {1e-9, 1e-3, 1.0, 4294967295.0, 1e14}) {
         for (int count = 0; count < 12; ++count) {
