@@ -53,6 +53,10 @@ public:
         acceptDrops();
         acceptShow();
     }
+    /// Nobody may ask for anything once this is gone, while `instance` still is there.
+    ~WindowProgram() { _instance.endServing(); }
+    WindowProgram(const WindowProgram&) = delete;
+    WindowProgram& operator=(const WindowProgram&) = delete;
 
     /// False if the child ended too early.
     bool show(const ShowRequest& request, SocketDirectory directory, ChildService* child) {
