@@ -24,7 +24,8 @@ constexpr std::chrono::seconds kPatience{10}; ///< for the next request
 
 class Activation {
 public:
-    explicit Activation(GDBusConnection* bus) : _turns(_queue), _guard(_queue), _instance(bus) {}
+    explicit Activation(GDBusConnection* bus)
+        : _turns(_queue), _guard(_queue), _programs(_queue), _instance(bus) {}
 
     void run() {
         _queue.onSignal({SIGINT, SIGTERM, SIGHUP}, [this](int /*signal*/) { _queue.stop(); });
@@ -41,13 +42,13 @@ private:
         ++_requests;
         ++_open;
         words.insert(words.begin(), windowProgram());
-        runBeside(
-            _queue, words,
+        _programs.start(
+            words,
             [this](const std::string& complaint) {
                 if (complaint.empty()) {
                     close();
                 } else {
-                    passOnComplaints(complaint);
+                    passOnComplaints(complaint + '\n');
                     tell(complaint);
                 }
             },
@@ -83,6 +84,7 @@ private:
     AsioMainQueue _queue;
     GlibTurns _turns;
     gtk::Guard _guard;
+    Programs _programs;
     std::size_t _requests = 0;
     int _open = 0; ///< processes, and dialogs
     Instance _instance;

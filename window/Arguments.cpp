@@ -88,7 +88,8 @@ std::string refusalOf(const BrowseOptions& options) {
 
 std::string canonical(const std::string& path) {
     std::error_code unknown;
-    const auto found = std::filesystem::weakly_canonical(std::filesystem::absolute(path), unknown);
+    const auto whole = std::filesystem::absolute(path, unknown);
+    const auto found = unknown ? whole : std::filesystem::weakly_canonical(whole, unknown);
     return unknown ? path : found.string();
 }
 

@@ -132,10 +132,7 @@ Instance::~Instance() {
     if (!_bus) {
         return;
     }
-    giveUpClaim();
-    releaseName(kApplicationId);
-    while (g_main_context_iteration(nullptr, FALSE) != FALSE) {
-    }
+    endServing();
     for (const guint object : _objects) {
         (void)g_dbus_connection_unregister_object(_bus.get(), object);
     }
@@ -213,11 +210,26 @@ void Instance::serve(Requests requests) {
     }
 }
 
+void Instance::endServing() {
+    if (!_bus) {
+        return;
+    }
+    giveUpClaim();
+    releaseName(kApplicationId);
+    _requests.present = nullptr;
+    while (g_main_context_iteration(nullptr, FALSE) != FALSE) {
+    }
+    _requests = {};
+}
+
 void Instance::answer(const Call& call) {
     if (!_requests.open) {
         return refuse(call.invocation, "The window is not ready.");
     }
     if (call.path == kWindowPath && call.method == "Activate") {
+        if (!_requests.present) {
+            return refuse(call.invocation, "The window is ending.");
+        }
         _requests.present(call.token());
         return call.done();
     }
@@ -253,8 +265,10 @@ void Instance::answerOpen(const Call& call) {
 /// Brings the window with this name, of whichever process, to the front.
 void Instance::showWindow(const std::string& name, const std::string& token) {
     if (name == _windowName) {
-        _requests.present(token);
-    } else if (name.starts_with(kWindowNames)) {
+        if (_requests.present) {
+            _requests.present(token);
+        }
+    } else if (name.starts_with(kWindowNames) && g_dbus_is_name(name.c_str()) != FALSE) {
         g_dbus_connection_call(_bus.get(), name.c_str(), kWindowPath, kInterface, "Activate",
                                g_variant_new("(@a{sv})", platformData(token)), nullptr,
                                G_DBUS_CALL_FLAGS_NO_AUTO_START, kAnswerTime, nullptr, nullptr,

@@ -42,7 +42,7 @@ public:
 
     /// Without a bus (null), nothing is asked and everything is claimed.
     explicit Instance(GDBusConnection* bus);
-    /// Answers what has already come for the application.
+    /// Ends serving.
     ~Instance();
     Instance(const Instance&) = delete;
     Instance& operator=(const Instance&) = delete;
@@ -57,6 +57,10 @@ public:
 
     /// Asks for the application's name. Requests come from the loop of the default context.
     void serve(Requests requests);
+    /// Gives up all names, and answers what has already come: what is to be opened is, but the
+    /// window no longer comes to the front, so that a start that asks for that opens its own. After
+    /// it, everything is refused.
+    void endServing();
 
 private:
     struct Call;

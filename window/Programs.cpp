@@ -12,7 +12,7 @@ namespace pallax {
 namespace {
 
 struct Waiting {
-    MainQueue& queue;
+    std::weak_ptr<MainQueue*> queue;
     std::function<void(const std::string&)> ended;
 };
 
@@ -26,17 +26,27 @@ void finished(GObject* process, GAsyncResult* result, gpointer data) {
     const bool isDone = g_subprocess_get_successful(ended) != FALSE ||
                         (g_subprocess_get_if_exited(ended) != FALSE &&
                          g_subprocess_get_exit_status(ended) == kExitFatalRecord);
-    std::string complaint = isDone ? "" : text != nullptr ? text : "The program was ended.";
+    std::string complaint = isDone || text == nullptr ? "" : text;
     g_free(text);
-    waiting->queue.async(
-        [ended = waiting->ended, complaint = std::move(complaint)] { ended(complaint); });
+    if (complaint.ends_with('\n')) {
+        complaint.pop_back();
+    }
+    if (!isDone && complaint.empty()) {
+        complaint = "The program was ended.";
+    }
+    if (const auto queue = waiting->queue.lock()) {
+        (*queue)->async(
+            [ended = waiting->ended, complaint = std::move(complaint)] { ended(complaint); });
+    }
 }
 
 } // namespace
 
-void runBeside(MainQueue& queue, const std::vector<std::string>& words,
-               const std::function<void(const std::string& complaint)>& ended,
-               const std::string& token) {
+Programs::Programs(MainQueue& queue) : _queue(std::make_shared<MainQueue*>(&queue)) {}
+
+void Programs::start(const std::vector<std::string>& words,
+                     const std::function<void(const std::string& complaint)>& ended,
+                     const std::string& token) {
     std::vector<const char*> arguments;
     arguments.reserve(words.size() + 1);
     for (const std::string& word : words) {
@@ -53,12 +63,12 @@ void runBeside(MainQueue& queue, const std::vector<std::string>& words,
     GError* error = nullptr;
     GSubprocess* process = g_subprocess_launcher_spawnv(launcher.get(), arguments.data(), &error);
     if (process == nullptr) {
-        queue.async([ended, complaint = std::string(error->message)] { ended(complaint); });
+        (*_queue)->async([ended, complaint = std::string(error->message)] { ended(complaint); });
         g_error_free(error);
         return;
     }
     g_subprocess_communicate_utf8_async(process, nullptr, nullptr, finished,
-                                        new Waiting{queue, ended});
+                                        new Waiting{_queue, ended});
     g_object_unref(process);
 }
 

@@ -27,6 +27,16 @@ std::string proposedName() {
     return name;
 }
 
+/// Opening another thing waits: a pipe for its reader, a device for ever.
+bool canBeFile(const std::string& path) {
+    std::error_code unknown; // making the file tells
+    const auto type = std::filesystem::status(path, unknown).type();
+    return type == std::filesystem::file_type::regular ||
+           type == std::filesystem::file_type::not_found ||
+           type == std::filesystem::file_type::directory || // refused at once
+           type == std::filesystem::file_type::none;
+}
+
 } // namespace
 
 Recordings::Recordings(Setup setup)
@@ -62,6 +72,10 @@ void Recordings::choose() {
 }
 
 void Recordings::begin(const std::string& path) {
+    if (!canBeFile(path)) {
+        return fail(
+            formatText("The recording %@ cannot be written: it is not a regular file.", {path}));
+    }
     // The chooser has asked whether an existing file may be replaced.
     RecordingFiles::Options options;
     options.path = path;

@@ -35,7 +35,7 @@ class WindowProgram {
 public:
     WindowProgram(GtkApplication* application, Instance& instance)
         : _application(application), _instance(instance), _turns(_queue), _guard(_queue),
-          _frame(application, _guard, {.closed = [this] { close(); }}),
+          _programs(_queue), _frame(application, _guard, {.closed = [this] { close(); }}),
           _recordings({.queue = _queue,
                        .frame = _frame,
                        .guard = _guard,
@@ -53,6 +53,10 @@ public:
         acceptDrops();
         acceptShow();
     }
+    /// Nobody may ask for anything once this is gone, while `instance` still is there.
+    ~WindowProgram() { _instance.endServing(); }
+    WindowProgram(const WindowProgram&) = delete;
+    WindowProgram& operator=(const WindowProgram&) = delete;
 
     /// False if the child ended too early.
     bool show(const ShowRequest& request, SocketDirectory directory, ChildService* child) {
@@ -189,8 +193,8 @@ private:
     /// is one; what it cannot do is told here.
     void open(std::vector<std::string> words, const std::string& token) {
         words.insert(words.begin(), windowProgram());
-        runBeside(
-            _queue, words,
+        _programs.start(
+            words,
             [this](const std::string& complaint) {
                 if (!complaint.empty()) {
                     _frame.showAlert(
@@ -264,16 +268,17 @@ private:
         const std::string page =
             folder / (std::filesystem::path(_recording).filename().string() + ".html");
         _frame.setMessage(gtk::translated("Making a report…"));
-        runBeside(_queue, {terminalProgram(), "report", _recording, "-o", page},
-                  [this, page](const std::string& complaint) {
-                      if (complaint.empty()) {
-                          gtk_show_uri(_frame.window(), ("file://" + page).c_str(),
-                                       GDK_CURRENT_TIME);
-                      } else {
-                          _frame.showAlert(
-                              {gtk::translated("No Report"), complaint, gtk::translated("Close")});
-                      }
-                  });
+        _programs.start({terminalProgram(), "report", _recording, "-o", page},
+                        [this, page](const std::string& complaint) {
+                            if (complaint.empty()) {
+                                gchar* address = g_filename_to_uri(page.c_str(), nullptr, nullptr);
+                                gtk_show_uri(_frame.window(), address, GDK_CURRENT_TIME);
+                                g_free(address);
+                            } else {
+                                _frame.showAlert({gtk::translated("No Report"), complaint,
+                                                  gtk::translated("Close")});
+                            }
+                        });
     }
 
     GtkApplication* _application;
@@ -281,6 +286,7 @@ private:
     AsioMainQueue _queue;
     GlibTurns _turns;
     gtk::Guard _guard;
+    Programs _programs;
     gtk::MainFrame _frame;
     std::string _recording; ///< its path; empty if what is shown is none
     std::optional<WindowSession> _session;

@@ -94,6 +94,10 @@ TEST(Arguments, TwoStartsShowTheSameIfSourceAndOptionsAreTheSame) {
     EXPECT_NE(key({}), key({"--connect", "car1"}));
 }
 
+TEST(Arguments, APathThatIsNoneIsLeftToWhoOpensIt) {
+    EXPECT_TRUE(key({""}));
+}
+
 TEST(Arguments, StandardInputAndALogOfTheShellAreNotShared) {
     EXPECT_EQ(key({"-"}), std::nullopt);
     EXPECT_EQ(key({"drive.pcap", "--log-level", "7"}), std::nullopt);

@@ -41,6 +41,19 @@ protected:
         EXPECT_EQ(run.out.find("DRIVE FAILED"), std::string::npos) << run.out;
         return contentOf(world.path("told"));
     }
+    /// Installs a program that opens pages, which writes what it is to open into the file "told".
+    void installBrowser() {
+        const std::string program = world.path("browser");
+        std::ofstream(program) << "#!/bin/sh\necho $1 >>" + world.path("told") + "\n";
+        fs::permissions(program, fs::perms::owner_all);
+        fs::create_directories(data("applications"));
+        std::ofstream(data("applications/browser.desktop"))
+            << "[Desktop Entry]\nType=Application\nName=Browser\nMimeType=text/html;\nExec=" +
+                   program + " %u\n";
+        std::ofstream(data("applications/mimeapps.list"))
+            << "[Default Applications]\ntext/html=browser.desktop\n";
+        ASSERT_EQ(runCommand("update-desktop-database " + data("applications")).status, 0);
+    }
     static bool hasDesktopTools() {
         return isInstalled("update-mime-database") && isInstalled("update-desktop-database") &&
                isInstalled("gio");
@@ -133,10 +146,24 @@ TEST_F(EndToEndDesktop, AFileThatCannotBeOpenedIsToldInADialog) {
         told("gapplication launch example.pallax.Pallax " + world.path("damaged.pcap") +
              "; echo $? | tell\n" +
              driving("has 'Cannot Open' has 'pallax: " + world.path("damaged.pcap") +
-                     " is not a recording*' press 'Close Close' "
+                     " is not a recording: it is neither pcap nor pcapng.' press 'Close Close' "
                      "lacks 'Cannot Open'") +
              endAll());
     EXPECT_EQ(lines, "0\n");
+}
+
+TEST_F(EndToEndDesktop, AReportOpensInTheBrowserWhateverItsNameIs) {
+    if (!hasDesktopTools()) {
+        GTEST_SKIP() << "desktop-file-utils, shared-mime-info or gio is not installed";
+    }
+    installBrowser();
+    const std::string copy = world.path("drive#1?%41.pcap");
+    fs::copy_file(lteDrive(), copy);
+    const std::string lines = told(start("'" + copy + "'") + " & p=$!\n" +
+                                   driving("has 'SIM Info' menu 'Report in the Browser'") +
+                                   "for i in $(seq 300); do test -s " + world.path("told") +
+                                   " && break; sleep 0.1; done\nkill -TERM $p; wait $p\n");
+    EXPECT_EQ(lines, world.path(".cache/pallax/drive#1?%41.pcap.html") + "\n");
 }
 
 TEST_F(EndToEndDesktop, RecentRecordingsAreOfferedUnlessTheyAreGoneOrSafe) {

@@ -145,6 +145,16 @@ TEST_F(EndToEndWindow, AfterAPlaceIsReachedTheKeysAreTheWindowsAgain) {
                        "key Return has '22:14:00, held*' key m has 'Marked 22:14:00*'"));
 }
 
+TEST_F(EndToEndWindow, MessagesMayComeInQuickSuccession) {
+    std::string held;
+    for (int time = 0; time < 100; ++time) {
+        held += "key d ";
+    }
+    expectDriven(drive(sample("lte-drive.pcap") + " --speed max",
+                       "has 'Updated 2023-11-14 at 22:15:20' focus 'SIM Info' " + held +
+                           "has 'Mark an instant first, with the key m.' open 'SIM Info'"));
+}
+
 TEST_F(EndToEndWindow, ALongSearchTellsHowFarItIsAndIsCancelled) {
     std::vector<Packet> packets;
     for (int number = 0; number < 100000; ++number) {

@@ -88,9 +88,22 @@ protected:
         return answer.error;
     }
 
+    /// Asks a name of the bus to come up, without waiting for the answer; it has been sent on.
+    void send(const std::string& name, const char* path) {
+        _desktop = connection();
+        g_dbus_connection_call(_desktop.get(), name.c_str(), path, "org.freedesktop.Application",
+                               "Activate", g_variant_new_parsed("(@a{sv} {},)"), nullptr,
+                               G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr, nullptr);
+        ASSERT_TRUE(g_dbus_connection_flush_sync(_desktop.get(), nullptr, nullptr));
+        g_variant_unref(g_dbus_connection_call_sync( // an answer from behind it
+            _desktop.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
+            "GetId", nullptr, nullptr, G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
+    }
+
     Words diary;
 
 private:
+    gtk::Ref<GDBusConnection> _desktop; ///< that has sent
     gtk::Ref<GTestDBus> _bus;
 };
 
@@ -181,7 +194,10 @@ TEST_F(InstanceTest, ANoticeBringsItsWindowToTheFront) {
         (void)g_main_context_iteration(nullptr, TRUE);
     }
     EXPECT_EQ(diary, (Words{"A comes to the front, token t", "B comes to the front, token t"}));
-    EXPECT_EQ(call("ActivateAction", "('show', [<'org.example.Other'>], @a{sv} {})"), "");
+    for (const std::string other :
+         {"org.example.Other", "example.pallax.Pallax.Window.s no name"}) {
+        EXPECT_EQ(call("ActivateAction", "('show', [<'" + other + "'>], @a{sv} {})"), "");
+    }
     EXPECT_EQ(diary.size(), 2U);
 }
 
@@ -189,17 +205,33 @@ TEST_F(InstanceTest, RequestsThatHaveComeWhenItEndsAreAnswered) {
     const auto bus = connection();
     auto a = std::make_unique<Instance>(bus.get());
     a->serve(requests("A"));
-    const auto desktop = connection();
-    g_dbus_connection_call(desktop.get(), kApplicationId, "/example/pallax/Pallax",
-                           "org.freedesktop.Application", "Activate",
-                           g_variant_new_parsed("(@a{sv} {},)"), nullptr, G_DBUS_CALL_FLAGS_NONE,
-                           -1, nullptr, nullptr, nullptr);
-    ASSERT_TRUE(g_dbus_connection_flush_sync(desktop.get(), nullptr, nullptr));
-    g_variant_unref(g_dbus_connection_call_sync( // an answer from behind it
-        desktop.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
-        "GetId", nullptr, nullptr, G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
+    send(kApplicationId, "/example/pallax/Pallax");
     a.reset();
     EXPECT_EQ(diary, Words{"A opens"});
+}
+
+TEST_F(InstanceTest, AWindowThatEndsNoLongerComesToTheFront) {
+    const auto bus = connection();
+    Instance a(bus.get());
+    ASSERT_TRUE(a.claim("drive.pcap", ""));
+    a.serve(requests("A"));
+    send(a.windowName(), "/example/pallax/Pallax/shown");
+    a.endServing();
+    EXPECT_EQ(diary, Words{});
+    EXPECT_EQ(a.windowName(), "");
+}
+
+TEST_F(InstanceTest, NothingIsAskedOfItAfterItsEnd) {
+    const auto bus = connection();
+    Instance a(bus.get());
+    a.serve(requests("A"));
+    a.endServing();
+    for (const char* path : {"/example/pallax/Pallax", "/example/pallax/Pallax/shown"}) {
+        send(g_dbus_connection_get_unique_name(bus.get()), path);
+        while (g_main_context_iteration(nullptr, FALSE) != FALSE) {
+        }
+    }
+    EXPECT_EQ(diary, Words{});
 }
 
 TEST(Instance, WithoutABusEverythingIsClaimed) {

@@ -1,13 +1,16 @@
 #include "window/Recordings.h"
 
+#include "host/Descriptor.h"
 #include "platform/RecordedTechnology.h"
 #include "tests/doubles/Files.h"
 #include "tests/ui/gtk/XDisplay.h"
 #include "tests/window/PacketsIn.h"
 
 #include <csignal>
+#include <fcntl.h>
 #include <filesystem>
 #include <sys/resource.h>
+#include <sys/stat.h>
 
 namespace pallax {
 namespace {
@@ -89,6 +92,16 @@ TEST_F(RecordingsTest, AFileThatCannotBeMadeIsAnAlert) {
     EXPECT_FALSE(recordings->isOn());
     EXPECT_EQ(alert(), "The recording " + folder.path("missing/drive.pcapng") +
                            " cannot be written: No such file or directory.");
+}
+
+/// Without its reader, opening it would not return.
+TEST_F(RecordingsTest, APipeIsRefused) {
+    const std::string path = folder.path("pipe");
+    ASSERT_EQ(::mkfifo(path.c_str(), S_IRUSR | S_IWUSR), 0);
+    const Descriptor reader(::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC));
+    recordings->begin(path);
+    EXPECT_FALSE(recordings->isOn());
+    EXPECT_EQ(alert(), "The recording " + path + " cannot be written: it is not a regular file.");
 }
 
 /// No file may grow beyond a size, as on a full disk, while it exists.

@@ -70,7 +70,7 @@ void MainFrame::build() {
     gtk_label_set_wrap(_oldValues, TRUE);
     showText(_oldValues, "");
     GtkWidget* panes = GTK_WIDGET(_messages.panes());
-    adw_toast_overlay_set_child(_messages.panes(), GTK_WIDGET(_panes));
+    gtk_overlay_set_child(_messages.panes(), GTK_WIDGET(_panes));
     gtk_widget_set_vexpand(panes, TRUE);
 
     GtkWidget* page = gtk_box_new(GTK_ORIENTATION_VERTICAL, 0);
@@ -80,7 +80,7 @@ void MainFrame::build() {
     }
     gtk_stack_add_named(_layers, page, kPanesPage);
     gtk_stack_set_transition_type(_layers, GTK_STACK_TRANSITION_TYPE_OVER_UP_DOWN);
-    adw_toast_overlay_set_child(_messages.window(), GTK_WIDGET(_layers));
+    gtk_overlay_set_child(_messages.window(), GTK_WIDGET(_layers));
     adw_application_window_set_content(ADW_APPLICATION_WINDOW(_window.get()),
                                        GTK_WIDGET(_messages.window()));
 }

@@ -3,7 +3,8 @@
 #include "ui/gtk/Ref.h"
 #include "ui/gtk/Signals.h"
 
-#include <adwaita.h>
+#include <cstdint>
+#include <gtk/gtk.h>
 #include <memory>
 #include <string>
 
@@ -11,6 +12,9 @@ namespace pallax::gtk {
 
 /// Sentences about what has just happened, each for some seconds or until the next one. They cover
 /// the lower end of the panes and nothing below them or, while a page covers the panes, its end.
+///
+/// They are labels and not the toolkit's toasts: libadwaita 1.2 uses a toast after it has freed it
+/// when some come in quick succession, as they do while a key is held.
 class Messages {
 public:
     explicit Messages(const Guard& guard);
@@ -19,20 +23,23 @@ public:
 
     void show(const std::string& text);
     /// What is around everything, and around the panes.
-    AdwToastOverlay* window() const { return _window.get(); }
-    AdwToastOverlay* panes() const { return _panes.get(); }
+    GtkOverlay* window() const { return _window.overlay.get(); }
+    GtkOverlay* panes() const { return _panes.overlay.get(); }
 
 private:
-    AdwToastOverlay* wantedPlace() const;
-    /// The panes were covered, or are seen again.
-    void move();
+    struct Place {
+        Place();
+        Ref<GtkOverlay> overlay;
+        GtkWidget* label; ///< the overlay owns it
+    };
+
+    void place();
 
     Guard _guard;
-    Ref<AdwToastOverlay> _window;
-    Ref<AdwToastOverlay> _panes;
-    Ref<AdwToast> _toast;              ///< the one that is seen, if there is one
-    AdwToastOverlay* _place = nullptr; ///< where it is
-    std::string _text;
+    Place _window;
+    Place _panes;
+    std::uint64_t _shown = 0; ///< so many
+    bool _isShowing = false;
     std::shared_ptr<Messages*> _alive = std::make_shared<Messages*>(this);
 };
 

@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <ctime>
+#include <filesystem>
 
 namespace pallax::gtk {
 
@@ -33,16 +34,25 @@ std::string typeOf(GFile* file) {
     return type != nullptr ? type : "application/octet-stream";
 }
 
+/// A menu would leave out a single "_", and underline what follows.
+std::string entryOf(const std::string& path) {
+    std::string entry;
+    for (const char each : shownText(std::filesystem::path(path).filename().string())) {
+        entry.append(each == '_' ? 2 : 1, each);
+    }
+    return entry;
+}
+
 } // namespace
 
 RecentFiles::RecentFiles(GtkWindow* window, const Guard& guard, GtkRecentManager* manager,
                          std::function<void(const std::string& path)> open)
     : _guard(guard), _manager(manager), _section(g_menu_new()) {
     const Ref<GSimpleActionGroup> actions(g_simple_action_group_new());
-    const Ref<GSimpleAction> opening(g_simple_action_new("open", G_VARIANT_TYPE_STRING));
+    const Ref<GSimpleAction> opening(g_simple_action_new("open", G_VARIANT_TYPE_BYTESTRING));
     connect(opening.get(), "activate", guard,
             std::function<void(GVariant*)>([open = std::move(open)](GVariant* path) {
-                open(g_variant_get_string(path, nullptr));
+                open(g_variant_get_bytestring(path));
             }));
     const Ref<GSimpleAction> clearing(g_simple_action_new("clear", nullptr));
     onSignal(clearing.get(), "activate", guard, [this] { clear(); });
@@ -141,9 +151,9 @@ void RecentFiles::refresh() {
     }
     const Ref<GMenu> names(g_menu_new());
     for (const std::string& path : files) {
-        const std::string name = shownText(taken(g_filename_display_basename(path.c_str())));
-        const Ref<GMenuItem> item(g_menu_item_new(name.c_str(), nullptr));
-        g_menu_item_set_action_and_target(item.get(), "recent.open", "s", path.c_str());
+        const Ref<GMenuItem> item(g_menu_item_new(entryOf(path).c_str(), nullptr));
+        // Its bytes: a name need not be UTF-8.
+        g_menu_item_set_action_and_target(item.get(), "recent.open", "^ay", path.c_str());
         g_menu_append_item(names.get(), item.get());
     }
     const Ref<GMenu> clearing(g_menu_new());

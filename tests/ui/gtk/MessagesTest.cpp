@@ -70,6 +70,18 @@ TEST_F(MessagesTest, TheLatestReplacesTheOneBefore) {
     EXPECT_NE(label("after"), nullptr);
 }
 
+TEST_F(MessagesTest, AreShownForThreeSeconds) {
+    stage->frame.setMessage("before");
+    stage->queue.advance(std::chrono::seconds(2));
+    stage->frame.setMessage("after");
+    stage->queue.advance(std::chrono::milliseconds(2900));
+    settle();
+    EXPECT_NE(label("after"), nullptr) << "its own three seconds";
+    stage->queue.advance(std::chrono::milliseconds(200));
+    settle();
+    EXPECT_EQ(label("after"), nullptr);
+}
+
 TEST_F(MessagesTest, StandAboveTheBars) {
     stage->frame.setMessage("done");
     settle();

@@ -39,6 +39,22 @@ protected:
         }
         stage->settle();
     }
+    /// What the menu says, and what each entry opens.
+    std::vector<std::pair<std::string, std::string>> offered() const {
+        std::vector<std::pair<std::string, std::string>> offered;
+        GMenuModel* recent = g_menu_model_get_item_link(files->section(), 0, G_MENU_LINK_SUBMENU);
+        for (int index = 0; index + 1 < g_menu_model_get_n_items(recent); ++index) {
+            gchar* label = nullptr;
+            gchar* path = nullptr;
+            EXPECT_TRUE(g_menu_model_get_item_attribute(recent, index, "label", "s", &label));
+            EXPECT_TRUE(g_menu_model_get_item_attribute(recent, index, "target", "^ay", &path));
+            offered.emplace_back(label, path != nullptr ? path : "");
+            g_free(label);
+            g_free(path);
+        }
+        g_object_unref(recent);
+        return offered;
+    }
     int entries() const { return g_menu_model_get_n_items(files->section()); }
 
     doubles::TemporaryFolder folder;
@@ -54,7 +70,26 @@ TEST_F(RecentFilesTest, ThoseThatWereShownAreOfferedAndOpened) {
     files->add(path);
     await(1);
     EXPECT_EQ(files->paths(), std::vector<std::string>{path});
-    ASSERT_TRUE(gtk_widget_activate_action(stage->window(), "recent.open", "s", path.c_str()));
+    ASSERT_TRUE(gtk_widget_activate_action(stage->window(), "recent.open", "^ay", path.c_str()));
+    EXPECT_EQ(opened, std::vector<std::string>{path});
+}
+
+/// A menu takes "__" for "_".
+TEST_F(RecentFilesTest, NamesAreOfferedAsTheyAre) {
+    const std::string path = file("drive_1.pcap");
+    files->add(path);
+    await(1);
+    EXPECT_EQ(offered(),
+              (std::vector<std::pair<std::string, std::string>>{{"drive__1.pcap", path}}));
+}
+
+TEST_F(RecentFilesTest, ANameThatIsNotUtf8IsOfferedAndOpened) {
+    const std::string path = file("drive\xFF\n.pcap");
+    files->add(path);
+    await(1);
+    EXPECT_EQ(offered(), (std::vector<std::pair<std::string, std::string>>{
+                             {"drive\xEF\xBF\xBD\\x0A.pcap", path}}));
+    ASSERT_TRUE(gtk_widget_activate_action(stage->window(), "recent.open", "^ay", path.c_str()));
     EXPECT_EQ(opened, std::vector<std::string>{path});
 }
 
