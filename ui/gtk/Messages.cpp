@@ -23,7 +23,7 @@ Messages::Place::Place()
     gtk_widget_set_halign(label, GTK_ALIGN_CENTER);
     gtk_widget_set_valign(label, GTK_ALIGN_END);
     gtk_widget_set_can_target(label, FALSE); // what it covers can be pressed
-    for (const char* style : {"osd", "heading", "pallax-message"}) {
+    for (const char* style : {"heading", "pallax-message"}) {
         gtk_widget_add_css_class(label, style);
     }
     gtk_overlay_add_overlay(overlay.get(), label);

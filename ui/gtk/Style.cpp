@@ -26,7 +26,10 @@ row { transition: none; }
 .pallax-heading { padding: 0; min-width: 0; min-height: 0; border-radius: 0; }
 .pallax-toolbar { border-top: 1px solid @borders; min-height: 34px; padding: 4px 10px; }
 .pallax-plot:focus-visible { outline: 2px solid @accent_color; }
-.pallax-message { padding: 10px 18px; margin: 12px; border-radius: 18px; }
+.pallax-message {
+    padding: 10px 18px; margin: 12px; border-radius: 18px;
+    color: white; background: #303034; border: 1px solid alpha(white, 0.3);
+}
 .pallax-span { padding-left: 8px; padding-right: 8px; min-width: 0; }
 .pallax-banner { padding: 4px 10px; background: alpha(@warning_bg_color, 0.3); }
 )";
