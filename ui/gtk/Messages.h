@@ -13,8 +13,8 @@ namespace pallax::gtk {
 /// Sentences about what has just happened, each for some seconds or until the next one. They cover
 /// the lower end of the panes and nothing below them or, while a page covers the panes, its end.
 ///
-/// They are labels and not the toolkit's toasts: libadwaita 1.2 uses a toast after it has freed it
-/// when some come in quick succession, as they do while a key is held.
+/// They are labels and not the toolkit's toasts: when these come in quick succession, as they do
+/// while a key is held, libadwaita 1.2 crashes (in adw_animation_skip).
 class Messages {
 public:
     explicit Messages(const Guard& guard);
