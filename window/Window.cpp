@@ -117,6 +117,10 @@ private:
               [this] { return _session && _session->isSafe(); }},
              {"afresh", gtk::translated("Start Afresh"), onSession(&WindowSession::startAfresh)}},
             {{"open", gtk::translated("Open Recording…"), [this] { chooseRecording(); }}}};
+        sections.back().push_back({.name = "save",
+                                   .label = gtk::translated("Save Snapshot…"),
+                                   .action = [this] { _frame.save(); },
+                                   .besides = _frame.saveButton()});
         if (isFile()) {
             sections.back().push_back(
                 {"report", gtk::translated("Report in the Browser"), [this] { report(); }});

@@ -209,10 +209,10 @@ TEST_F(EndToEndWindow, ClosingTheWindowEndsTheProgram) {
 
 TEST_F(EndToEndWindow, ASnapshotIsSaved) {
     const std::string folder = offerSaving(world.path("marker"));
-    expectDriven(
-        drive(sample("lte-drive.pcap") + " --speed max",
-              "has 'SIM Info' press Save has 'DLF binary*' type 'Description=tunnel entrance' "
-              "press Save lacks 'DLF binary*' has 'Saved *'"));
+    expectDriven(drive(
+        sample("lte-drive.pcap") + " --speed max",
+        "has 'SIM Info' menu 'Save Snapshot…' has 'DLF binary*' type 'Description=tunnel entrance' "
+        "press Save lacks 'DLF binary*' has 'Saved *'"));
     std::string content;
     for (const auto& entry : std::filesystem::directory_iterator(folder)) {
         std::ifstream file(entry.path());

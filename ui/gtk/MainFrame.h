@@ -70,6 +70,9 @@ public:
     WidgetNavigation* shownStack() const { return _stack; }
     /// The panes whose application lives.
     WidgetNavigation* liveStack() const { return _live; }
+    /// The toolbar's button; seen where a snapshot can be saved.
+    GtkWidget* saveButton() const { return GTK_WIDGET(_save); }
+    void save() { _saveAction(); }
     /// The keyboard goes to the panes.
     void focusPanes() { gtk_widget_child_focus(GTK_WIDGET(_panes), GTK_DIR_TAB_FORWARD); }
     /// Below the panes.

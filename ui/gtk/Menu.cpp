@@ -34,7 +34,14 @@ GtkWidget* menuButton(GtkWindow* window, const Guard& guard,
         for (const MenuEntry& entry : section) {
             const Ref<GSimpleAction> action = actionOf(entry, guard);
             g_action_map_add_action(G_ACTION_MAP(actions.get()), G_ACTION(action.get()));
-            g_menu_append(made.get(), entry.label.c_str(), ("window." + entry.name).c_str());
+            const Ref<GMenuItem> item(
+                g_menu_item_new(entry.label.c_str(), ("window." + entry.name).c_str()));
+            if (entry.besides != nullptr) {
+                g_menu_item_set_attribute(item.get(), "hidden-when", "s", "action-disabled");
+                g_object_bind_property(entry.besides, "visible", action.get(), "enabled",
+                                       G_BINDING_SYNC_CREATE);
+            }
+            g_menu_append_item(made.get(), item.get());
         }
         g_menu_append_section(menu.get(), nullptr, G_MENU_MODEL(made.get()));
     }

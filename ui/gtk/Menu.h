@@ -16,6 +16,8 @@ struct MenuEntry {
     std::function<void()> action;
     /// Of an entry with a check mark, whether it is set, asked whenever the action has run.
     std::function<bool()> isOn = nullptr;
+    /// The entry is there while this widget is visible, which must outlive the menu; null: always.
+    GtkWidget* besides = nullptr;
 };
 
 /// A button with a menu of these sections, whose actions are the window's ("window.open").

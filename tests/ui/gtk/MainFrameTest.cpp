@@ -86,6 +86,22 @@ TEST_F(MainFrameTest, TheMenuRunsActionsOfTheWindow) {
     EXPECT_TRUE(isOn);
 }
 
+TEST_F(MainFrameTest, AnEntryMayBeThereOnlyWhileAButtonIsSeen) {
+    WindowStage stage(360, 720);
+    int saved = 0;
+    gtk_widget_set_visible(stage.frame.saveButton(), FALSE);
+    stage.frame.setMenu(menuButton(stage.frame.window(), stage.guard,
+                                   {{{.name = "save",
+                                      .label = "Save Snapshot…",
+                                      .action = [&] { ++saved; },
+                                      .besides = stage.frame.saveButton()}}}));
+    (void)gtk_widget_activate_action(stage.window(), "window.save", nullptr);
+    EXPECT_EQ(saved, 0);
+    gtk_widget_set_visible(stage.frame.saveButton(), TRUE);
+    (void)gtk_widget_activate_action(stage.window(), "window.save", nullptr);
+    EXPECT_EQ(saved, 1);
+}
+
 TEST_F(MainFrameTest, FitsAPhoneWithLargeTexts) {
     GtkSettings* settings = gtk_settings_get_default();
     gint usual = 0;
