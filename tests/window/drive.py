@@ -26,6 +26,7 @@ gi.require_version("Atspi", "2.0")
 from gi.repository import Atspi  # noqa: E402
 
 PATIENCE = 30  # seconds
+LEAVES = (Atspi.Role.LABEL, Atspi.Role.IMAGE, Atspi.Role.SCROLL_BAR, Atspi.Role.LEVEL_BAR)
 KEYS = {"space": 0x20, "Tab": 0xFF09, "Up": 0xFF52, "Return": 0xFF0D, "Escape": 0xFF1B, "Right": 0xFF53, "Left": 0xFF51, "Down": 0xFF54, "Home": 0xFF50, "End": 0xFF57}
 
 
@@ -53,12 +54,21 @@ def walk(node):
         yield from walk(child)
 
 
-def walk_back(node):
-    """The same nodes from the last one."""
+def role_of(node):
+    try:
+        return node.get_role()
+    except Exception:  # it is gone
+        return None
+
+
+def walk_back(node, is_row=False):
+    """The same nodes from the last one, without what is in rows, whose names say it: each takes long to ask."""
     if node is None:
         return
-    for child in reversed(children(node)):
-        yield from walk_back(child)
+    role = role_of(node)
+    if role not in LEAVES and not is_row:
+        for child in reversed(children(node)):
+            yield from walk_back(child, role == Atspi.Role.LIST_ITEM)
     yield node
 
 
