@@ -1,5 +1,6 @@
 #include "host/CapturePieces.h"
 
+#include "host/CaptureFormat.h"
 #include "text/Bytes.h"
 #include "text/Format.h"
 
@@ -7,43 +8,24 @@
 #include <limits>
 #include <utility>
 
-// pcap: a header of 24 bytes (0 magic, 20 link type in the lower 28 bits), then for each packet
-// 16 bytes (0 stamp, 8 captured length, 12 original length) and its data. The blocks of pcapng are
-// described in PcapNgWriter.cpp.
-
 namespace pallax {
 
 namespace {
 
+using namespace capture;
 using PieceKind = CapturePiece::Kind;
 
 constexpr std::size_t kMost = std::size_t{64} << 20U; // bytes of a piece
-constexpr std::size_t kNumber = 4;
-
-constexpr std::size_t kPcapHeader = 24;
 constexpr std::size_t kLinkTypeAt = 20;
 constexpr std::uint32_t kLinkTypeMask = 0x0FFFFFFF;
-constexpr std::size_t kRecordHeader = 16;
 constexpr std::size_t kCapturedAt = 8;
 
-constexpr std::size_t kBlockHeader = 8;
-constexpr std::size_t kBlockFrame = 12;
-constexpr std::uint32_t kSection = 0x0A0D0D0A;
-constexpr std::uint32_t kInterface = 1;
-constexpr std::uint32_t kOldPacket = 2;
-constexpr std::uint32_t kSimplePacket = 3;
-constexpr std::uint32_t kEnhancedPacket = 6;
-constexpr std::uint32_t kStatistics = 5;
 constexpr std::size_t kSectionOptions = kBlockHeader + 16;
 constexpr std::size_t kInterfaceOptions = kBlockHeader + 8;
 constexpr std::size_t kStatisticsOptions = kBlockHeader + 12;
-constexpr std::size_t kPacketData = kBlockHeader + 20;
+constexpr std::size_t kPacketData = kBlockHeader + kEnhancedHead;
 constexpr std::size_t kPacketCaptured = kBlockHeader + 12;
 constexpr std::size_t kSimpleData = kBlockHeader + 4;
-
-constexpr std::size_t padded(std::size_t length) {
-    return (length + kNumber - 1) / kNumber * kNumber;
-}
 
 std::uint32_t numberIn(const ByteBuffer& bytes, std::size_t at, std::size_t width,
                        bool isBigEndian) {
@@ -57,9 +39,13 @@ std::uint32_t numberIn(const ByteBuffer& bytes, std::size_t at, std::size_t widt
 
 } // namespace
 
+bool CapturePiece::isSection() const {
+    return blockType == kSection;
+}
+
 void CapturePiece::setNumber(std::size_t at, std::uint32_t number) {
-    for (std::size_t index = 0; index < kNumber; ++index) {
-        const std::size_t place = isBigEndian ? kNumber - 1 - index : index;
+    for (std::size_t index = 0; index < kWord; ++index) {
+        const std::size_t place = isBigEndian ? kWord - 1 - index : index;
         bytes[at + place] = static_cast<std::uint8_t>(number >> (index * kByteBits));
     }
 }
@@ -81,13 +67,13 @@ void CapturePiece::setPacket(Bytes packet) {
     dataLength = packet.size();
     if (!isBlock) {
         setNumber(kCapturedAt, length);
-        setNumber(kCapturedAt + kNumber, length);
+        setNumber(kCapturedAt + kWord, length);
         return;
     }
     const auto whole = static_cast<std::uint32_t>(bytes.size());
-    setNumber(kNumber, whole);
-    setNumber(bytes.size() - kNumber, whole);
-    setNumber(data - kNumber, length); // the original length
+    setNumber(kWord, whole);
+    setNumber(bytes.size() - kWord, whole);
+    setNumber(data - kWord, length); // the original length
     if (blockType != kSimplePacket) {
         setNumber(kPacketCaptured, length);
     }
@@ -159,7 +145,7 @@ std::optional<CapturePiece> CapturePieces::fileHeader() {
     }
     const auto isMagic = [&](bool isBigEndian) {
         return std::find(kMagics.begin(), kMagics.end(),
-                         numberIn(piece.bytes, 0, kNumber, isBigEndian)) != kMagics.end();
+                         numberIn(piece.bytes, 0, kWord, isBigEndian)) != kMagics.end();
     };
     if (!isMagic(false) && !isMagic(true)) {
         return fail("is not a recording: it is neither pcap nor pcapng");
@@ -174,13 +160,13 @@ std::optional<CapturePiece> CapturePieces::record() {
     piece.kind = PieceKind::Packet;
     piece.isBigEndian = _isBigEndian;
     piece.linkType = _interfaces.front().linkType;
-    if (!read(piece.bytes, kRecordHeader)) {
+    if (!read(piece.bytes, kPcapPacketHeader)) {
         return piece.bytes.empty() && _content.ending() == DecompressedFile::Ending::Whole &&
                        std::ferror(_content.content) == 0
                    ? std::nullopt
                    : cut();
     }
-    piece.data = kRecordHeader;
+    piece.data = kPcapPacketHeader;
     piece.dataLength = number(piece.bytes, kCapturedAt);
     if (piece.dataLength > kMost) {
         return fail("cannot be read further: a packet claims too many bytes");
@@ -196,20 +182,20 @@ std::optional<CapturePiece> CapturePieces::block() {
                    ? std::nullopt
                    : cut();
     }
-    if (numberIn(piece.bytes, 0, kNumber, false) == kSection && !beginSection(piece)) {
+    if (numberIn(piece.bytes, 0, kWord, false) == kSection && !beginSection(piece)) {
         return _error ? std::nullopt : cut();
     }
     piece.isBigEndian = _isBigEndian;
     piece.blockType = number(piece.bytes, 0);
-    const std::size_t length = number(piece.bytes, kNumber);
+    const std::size_t length = number(piece.bytes, kWord);
     if (length < std::max(kBlockFrame, piece.bytes.size()) || length > kMost ||
-        length % kNumber != 0) {
+        length % kWord != 0) {
         return fail("cannot be read further: a block of an impossible length");
     }
     if (!read(piece.bytes, length - piece.bytes.size())) {
         return cut();
     }
-    if (number(piece.bytes, length - kNumber) != length || !describe(piece)) {
+    if (number(piece.bytes, length - kWord) != length || !describe(piece)) {
         return fail("cannot be read further: a block that contradicts itself");
     }
     return piece;
@@ -217,12 +203,11 @@ std::optional<CapturePiece> CapturePieces::block() {
 
 /// Reads the byte order, which follows the length that is written in it.
 bool CapturePieces::beginSection(CapturePiece& piece) {
-    constexpr std::uint32_t kMagic = 0x1A2B3C4D;
-    if (!read(piece.bytes, kNumber)) {
+    if (!read(piece.bytes, kWord)) {
         return false;
     }
-    _isBigEndian = numberIn(piece.bytes, kBlockHeader, kNumber, true) == kMagic;
-    if (!_isBigEndian && numberIn(piece.bytes, kBlockHeader, kNumber, false) != kMagic) {
+    _isBigEndian = numberIn(piece.bytes, kBlockHeader, kWord, true) == kByteOrderMagic;
+    if (!_isBigEndian && numberIn(piece.bytes, kBlockHeader, kWord, false) != kByteOrderMagic) {
         (void)fail("is not a recording: it is neither pcap nor pcapng");
         return false;
     }
@@ -240,15 +225,15 @@ bool CapturePieces::describe(CapturePiece& piece) {
         addComments(piece, kSectionOptions);
         return true;
     case kInterface: {
-        const std::uint32_t longest = number(piece.bytes, kBlockHeader + kNumber);
+        const std::uint32_t longest = number(piece.bytes, kBlockHeader + kWord);
         piece.kind = PieceKind::Header;
         _interfaces.push_back(
             {number(piece.bytes, kBlockHeader, kShort), longest == 0 ? kAny : longest});
         addComments(piece, kInterfaceOptions);
-        return piece.bytes.size() >= kInterfaceOptions + kNumber;
+        return piece.bytes.size() >= kInterfaceOptions + kWord;
     }
     case kEnhancedPacket:
-        return describePacket(piece, kPacketData, kNumber);
+        return describePacket(piece, kPacketData, kWord);
     case kOldPacket:
         return describePacket(piece, kPacketData, kShort);
     case kSimplePacket:
@@ -265,7 +250,7 @@ bool CapturePieces::describe(CapturePiece& piece) {
 /// `interfaceWidth`: of the number of the interface; 0 for a block without one.
 bool CapturePieces::describePacket(CapturePiece& piece, std::size_t head,
                                    std::size_t interfaceWidth) {
-    const std::size_t room = piece.bytes.size() - kNumber;
+    const std::size_t room = piece.bytes.size() - kWord;
     const std::size_t index =
         interfaceWidth == 0 ? 0 : number(piece.bytes, kBlockHeader, interfaceWidth);
     if (room < head || index >= _interfaces.size()) {
@@ -295,11 +280,11 @@ void CapturePieces::addComments(CapturePiece& piece, std::size_t options) const 
     constexpr std::uint32_t kLastAddress = 7;
     constexpr std::uint32_t kFirstPrivate = 2988; // custom options, and those of no standard
     constexpr std::size_t kShort = 2;
-    const std::size_t end = piece.bytes.size() - kNumber;
-    while (options + kNumber <= end) {
+    const std::size_t end = piece.bytes.size() - kWord;
+    while (options + kWord <= end) {
         const std::uint32_t code = number(piece.bytes, options, kShort);
         const std::size_t length = number(piece.bytes, options + kShort, kShort);
-        const std::size_t value = options + kNumber;
+        const std::size_t value = options + kWord;
         if (code == 0 || length > end - value) {
             break;
         }
@@ -311,7 +296,7 @@ void CapturePieces::addComments(CapturePiece& piece, std::size_t options) const 
         options = value + padded(length);
     }
     // What follows the end of the options belongs to nothing.
-    const std::size_t rest = options + kNumber;
+    const std::size_t rest = options + kWord;
     if (rest < end) {
         piece.remarks.push_back({rest, end - rest});
     }

@@ -36,14 +36,12 @@ struct CapturePiece {
     bool isBigEndian = false;
 
     /// Whether a section of pcapng begins with it.
-    bool isSection() const { return blockType == kSectionType; }
+    bool isSection() const;
     Bytes packet() const { return Bytes(bytes).subspan(data, dataLength); }
     /// Replaces the bytes of the packet, in place if the length is the same.
     void setPacket(Bytes packet);
 
 private:
-    static constexpr std::uint32_t kSectionType = 0x0A0D0D0A;
-
     void setNumber(std::size_t at, std::uint32_t number);
 };
 

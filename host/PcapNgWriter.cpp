@@ -1,5 +1,6 @@
 #include "host/PcapNgWriter.h"
 
+#include "host/CaptureFormat.h"
 #include "host/Interruption.h"
 #include "text/Format.h"
 
@@ -10,23 +11,11 @@
 #include <sys/file.h>
 #include <sys/stat.h>
 
-// A block of a pcapng file is its type, its total length, its body, padded to a multiple of 4
-// bytes, and its length again. The bodies, offsets in bytes:
-//
-//   section header     0 byte-order magic, 4 version, 8 length of the section (unknown), options
-//   interface          0 link type (16 bits), 4 largest packet, options
-//   enhanced packet    0 interface, 4 stamp (high half first), 12 captured length,
-//                      16 original length, data
-//
-// An option is its number and its length (16 bits each) and its value, padded to 4 bytes.
-
 namespace pallax {
 
 namespace {
 
-constexpr std::uint32_t kSectionHeader = 0x0A0D0D0A;
-constexpr std::uint32_t kInterface = 1;
-constexpr std::uint32_t kEnhancedPacket = 6;
+using namespace capture;
 
 constexpr std::uint16_t kEndOfOptions = 0;
 constexpr std::uint16_t kInterfaceName = 2;
@@ -34,13 +23,6 @@ constexpr std::uint16_t kSectionProgram = 4;
 constexpr std::uint16_t kStampResolution = 9;
 
 constexpr char kNanoseconds = 9; // the unit of stamps is 10 to the power of -9 s
-constexpr std::size_t kAlignment = 4;
-constexpr std::size_t kBlockFrame = 12; // type and both lengths
-constexpr std::size_t kPacketHead = 20; // of an enhanced packet's body, before the data
-
-std::size_t padded(std::size_t length) {
-    return (length + kAlignment - 1) / kAlignment * kAlignment;
-}
 
 /// Builds a block.
 class Block {
@@ -83,11 +65,10 @@ private:
 };
 
 ByteBuffer sectionHeader() {
-    constexpr std::uint32_t kByteOrderMagic = 0x1A2B3C4D;
     constexpr std::uint32_t kVersion = 1; // 1.0, each half a 16-bit number
     constexpr std::uint32_t kUnknown = 0xFFFFFFFF;
     constexpr std::size_t kRoughSize = 32;
-    return Block(kSectionHeader, kRoughSize)
+    return Block(kSection, kRoughSize)
         .u32(kByteOrderMagic)
         .u32(kVersion)
         .u32(kUnknown)
@@ -166,7 +147,7 @@ std::optional<HostError> PcapNgWriter::begin(int linkType, std::string_view name
 }
 
 std::uint64_t PcapNgWriter::sizeOfPacket(std::size_t length) {
-    return kBlockFrame + kPacketHead + padded(length);
+    return kBlockFrame + kEnhancedHead + padded(length);
 }
 
 std::optional<HostError> PcapNgWriter::write(Time time, Bytes packet) {
@@ -175,7 +156,7 @@ std::optional<HostError> PcapNgWriter::write(Time time, Bytes packet) {
     const auto sinceEpoch = std::max<std::int64_t>(time.time_since_epoch().count(), 0);
     const auto stamp = static_cast<std::uint64_t>(sinceEpoch);
     const auto length = static_cast<std::uint32_t>(packet.size());
-    auto error = putHashed(Block(kEnhancedPacket, kPacketHead + packet.size())
+    auto error = putHashed(Block(kEnhancedPacket, kEnhancedHead + packet.size())
                                .u32(kOnlyInterface)
                                .u32(static_cast<std::uint32_t>(stamp >> kHalf))
                                .u32(static_cast<std::uint32_t>(stamp))

@@ -1,7 +1,9 @@
 #include "host/RecordingJournal.h"
 
+#include "host/CaptureFormat.h"
 #include "host/Decompression.h"
 #include "host/EmbeddedDigests.h"
+#include "host/PcapNgWriter.h"
 #include "host/RecordingFile.h"
 #include "text/Format.h"
 
@@ -14,15 +16,6 @@
 namespace pallax {
 
 namespace {
-
-constexpr std::uint64_t kPcapHeader = 16;
-
-/// What a packet takes in a pcapng file at least.
-std::uint64_t pcapNgSize(std::size_t length) {
-    constexpr std::uint64_t kBlock = 32;
-    constexpr std::uint64_t kWord = 4;
-    return kBlock + (length + kWord - 1) / kWord * kWord;
-}
 
 std::size_t digestOf(Bytes data) {
     return std::hash<std::string_view>()(
@@ -119,8 +112,8 @@ private:
     /// packet.)
     void account(const RecordedPacket& packet, std::uint64_t number) {
         const std::size_t length = packet.data.size();
-        _asPcap += kPcapHeader + length;
-        _asPcapNg += pcapNgSize(length);
+        _asPcap += capture::kPcapPacketHeader + length;
+        _asPcapNg += PcapNgWriter::sizeOfPacket(length);
         if (number % kPlacesEvery != 1) {
             return;
         }
@@ -133,7 +126,8 @@ private:
         const bool isPcapNg = end == asPcapNg || end == asPcapNg + kDigests;
         if (_journal._places.empty() || _journal._places.back().packet < number) {
             _journal._canSeek = _journal._canSeek && (number == 1 || isPcap || isPcapNg);
-            const std::uint64_t size = isPcap ? kPcapHeader + length : pcapNgSize(length);
+            const std::uint64_t size =
+                isPcap ? capture::kPcapPacketHeader + length : PcapNgWriter::sizeOfPacket(length);
             _journal._places.push_back(
                 {number, end - size, packet.time, length, digestOf(packet.data)});
             _journal._read = end;
