@@ -5,6 +5,7 @@
 
 #include "fuzz/QueryTimeline.h"
 #include "query/QueryTable.h"
+#include "query/SqlTokens.h"
 
 #include <algorithm>
 #include <array>
@@ -30,15 +31,11 @@ Answer answerOf(Database& database, const std::string& text) {
     return answer;
 }
 
-std::string quoted(std::string_view name) {
-    return "\"" + std::string(name) + "\"";
-}
-
 /// Numbers of a REAL column come as whole ones from a table, and as real ones from its copy.
 std::string columnsOf(const Database::Table& table, bool asReal) {
     std::string columns;
     for (const Column& column : table.columns) {
-        columns += (columns.empty() ? "" : ", ") + quoted(column.name);
+        columns += (columns.empty() ? "" : ", ") + quotedName(column.name);
         columns += asReal && column.type == "REAL" ? " * 1.0" : "";
     }
     return columns;
@@ -49,7 +46,7 @@ std::string conditionOf(Database& database, const Database::Table& table, const 
     static constexpr auto kOperators =
         std::to_array<const char*>({"=", "<", "<=", ">", ">=", "<>", "is", "is not", "like"});
     constexpr std::uint8_t kLow = 0x7F;
-    const std::string column = quoted(table.columns[input[0] % table.columns.size()].name);
+    const std::string column = quotedName(table.columns[input[0] % table.columns.size()].name);
     const Answer values = answerOf(database, "select quote(" + column + ") from " + name +
                                                  " limit 1 offset " + std::to_string(input[2]));
     std::string value = values.empty() ? std::string("null") : std::get<std::string>(values[0][0]);
@@ -74,7 +71,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     if (table.name == "series") { // its arguments are no conditions
         return 0;
     }
-    const std::string name = quoted(table.schema) + "." + quoted(table.name);
+    const std::string name = quotedName(table.schema) + "." + quotedName(table.name);
     std::string conditions;
     for (std::size_t at = 1; at + kCondition <= std::min(size, 1 + kCondition * kMostConditions);
          at += kCondition) {

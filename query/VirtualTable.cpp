@@ -1,6 +1,7 @@
 #include "query/VirtualTable.h"
 
 #include "query/QueryTable.h"
+#include "query/SqlTokens.h"
 
 #include <algorithm>
 #include <charconv>
@@ -41,18 +42,10 @@ int fail(sqlite3_vtab& table, const std::exception& error) {
     return SQLITE_ERROR;
 }
 
-std::string quoted(std::string_view name) {
-    std::string text = "\"";
-    for (const char character : name) {
-        text.append(character == '"' ? 2 : 1, character);
-    }
-    return text + "\"";
-}
-
 std::string declarationOf(const QueryTable& table) {
     std::string text = "CREATE TABLE x(";
     for (const Column& column : table.columns()) {
-        text += (text.back() == '(' ? "" : ", ") + quoted(column.name) + " ";
+        text += (text.back() == '(' ? "" : ", ") + quotedName(column.name) + " ";
         text.append(column.type).append(column.isHidden ? " HIDDEN" : "");
     }
     return text + ")";
@@ -301,7 +294,7 @@ sqlite3_module moduleOfTables() {
 
 bool addVirtualTable(sqlite3& connection, const char* name, AddedTable& added) {
     static const sqlite3_module kModule = moduleOfTables();
-    const std::string module = quoted(name);
+    const std::string module = quotedName(name);
     if (sqlite3_create_module_v2(&connection, name, &kModule, &added, nullptr) != SQLITE_OK) {
         return false;
     }
