@@ -3,6 +3,7 @@
 #include "host/RecordingWriter.h"
 #include "samples/Samples.h"
 #include "tests/cli/PallaxProcess.h"
+#include "tests/doubles/PropertyListRecord.h"
 #include "tests/doubles/RecordBuilder.h"
 
 #include <gtest/gtest.h>
@@ -20,6 +21,8 @@ protected:
     static constexpr int kGsmLinkType = 148;
     static constexpr LogCode kRegistration = 0x7132; // byte 13 is the service state
     static constexpr LogCode kSimFiles = 0xFF0000;
+    static constexpr const char* kIccid = "8949020000012345670";
+    static constexpr const char* kMaskedIccid = "0000000000000000000";
 
     using Packet = std::pair<std::chrono::milliseconds, ByteBuffer>;
 
@@ -43,6 +46,20 @@ protected:
             EXPECT_EQ((*writer)->write(kSampleStart + sinceStart, bytes), std::nullopt);
         }
         return path;
+    }
+
+    /// A SIM-file record with a number that identifies its owner, and further members.
+    static ByteBuffer simFiles(const std::string& members = "") {
+        return doubles::textRecord(kSimFiles,
+                                   std::string("{kSimFile_ICCID = ") + kIccid + ";" + members + "}")
+            .prefixed();
+    }
+    /// Writes a recording of that SIM, whose network is called Net.
+    std::string withSim() const {
+        using std::chrono::milliseconds;
+        return record("sim.pcap", {{milliseconds(0), registration(1)},
+                                   {milliseconds(500), simFiles("kSimFile_PNN = Net;")},
+                                   {milliseconds(3000), registration(2)}});
     }
 
     /// The sample recording of a GSM attach, 51 packets over half a minute.

@@ -11,13 +11,9 @@ class EndToEndMask : public EndToEnd {
 protected:
     std::string attachWithSim() const {
         using std::chrono::milliseconds;
-        return record("sim.pcap",
-                      {{milliseconds(0), registration(1)},
-                       {milliseconds(500),
-                        doubles::textRecord(kSimFiles, "{kSimFile_ICCID = 8949020000012345670; "
-                                                       "kSimFile_AD = 1;}")
-                            .prefixed()},
-                       {milliseconds(900), doubles::Record(0xABCD).u8(1).prefixed()}});
+        return record("sim.pcap", {{milliseconds(0), registration(1)},
+                                   {milliseconds(500), simFiles("kSimFile_AD = 1;")},
+                                   {milliseconds(900), doubles::Record(0xABCD).u8(1).prefixed()}});
     }
     std::string decoded(const std::string& path) const { return run({"decode", path}).out; }
 };
@@ -31,7 +27,7 @@ TEST_F(EndToEndMask, WritesACopyWithoutIdentitiesAndCounts) {
                             ": 3 packets, 1 value masked; 1 packet that cannot be understood "
                             "zeroed.\n");
     std::string expected = decoded(attachWithSim());
-    const std::string iccid = "8949020000012345670";
+    const std::string iccid = kIccid;
     ASSERT_NE(expected.find(iccid), std::string::npos);
     expected.replace(expected.find(iccid), iccid.size(), iccid.size(), '0');
     EXPECT_EQ(decoded(copy), expected);

@@ -1,5 +1,4 @@
 #include "tests/cli/EndToEndScreen.h"
-#include "tests/doubles/PropertyListRecord.h"
 
 namespace pallax {
 namespace {
@@ -10,7 +9,6 @@ using doubles::PallaxProcess;
 /// A viewer that shows nothing that identifies a person.
 class EndToEndSafe : public EndToEndScreen {
 protected:
-    static constexpr const char* kIccid = "8949020000012345670";
     static constexpr const char* kCopiedIccid = "ODk0OTAyMDAwMDAxMjM0NTY3MA=="; ///< in base64
 
     /// Nothing that the terminal has got from there on, copied texts included, is of the identity.
@@ -30,7 +28,7 @@ protected:
     /// finds it in a frame and in the recording, lists events and asks in SQL.
     static void useEveryKey(PallaxTerminal& terminal) {
         terminal.type("y");
-        ASSERT_TRUE(terminal.shows("Copied: 0000000000000000000"));
+        ASSERT_TRUE(terminal.shows(std::string("Copied: ") + kMaskedIccid));
         terminal.type("i");
         ASSERT_TRUE(terminal.shows("EF-ICCID"));
         terminal.type(std::string("y") + kEscape + "vV");
@@ -51,17 +49,6 @@ protected:
         (void)terminal.settled();
         terminal.type(std::string(kEscape) + "$");
     }
-
-    std::string withSim() const {
-        using std::chrono::milliseconds;
-        return record("sim.pcap",
-                      {{milliseconds(0), registration(1)},
-                       {milliseconds(500),
-                        doubles::textRecord(kSimFiles, std::string("{kSimFile_ICCID = ") + kIccid +
-                                                           "; kSimFile_PNN = Net;}")
-                            .prefixed()},
-                       {milliseconds(3000), registration(2)}});
-    }
 };
 
 TEST_F(EndToEndSafe, PrintsWhatTheMaskedRecordingHolds) {
@@ -69,7 +56,7 @@ TEST_F(EndToEndSafe, PrintsWhatTheMaskedRecordingHolds) {
     ASSERT_EQ(run({"mask", withSim(), "-o", copy}).status, 0);
     const Run safe = run({withSim(), "--print", "--safe", "--speed", "max"});
     EXPECT_EQ(safe.status, 0);
-    EXPECT_NE(safe.out.find("EF-ICCID: 0000000000000000000\n"), std::string::npos);
+    EXPECT_NE(safe.out.find(std::string("EF-ICCID: ") + kMaskedIccid + "\n"), std::string::npos);
     EXPECT_EQ(safe.out, run({copy, "--print", "--speed", "max"}).out);
 }
 
@@ -80,10 +67,10 @@ TEST_F(EndToEndSafe, NoKeyShowsFindsOrSavesAnIdentity) {
     ASSERT_TRUE(terminal.shows("1 of 26"));
     terminal.type("\r");
     ASSERT_TRUE(terminal.shows("Pallax › SIM Info"));
-    ASSERT_TRUE(terminal.shows("0000000000000000000"));
+    ASSERT_TRUE(terminal.shows(kMaskedIccid));
     EXPECT_TRUE(terminal.shows("Net"));
     terminal.type("i"); // the page of the value
-    ASSERT_TRUE(terminal.shows("0000000000000000000"));
+    ASSERT_TRUE(terminal.shows(kMaskedIccid));
     terminal.type(kEscape);
     terminal.type(","); // the past comes from what has been received
     ASSERT_TRUE(terminal.shows("held"));
@@ -121,10 +108,10 @@ TEST_F(EndToEndSafe, AKeyHidesIdentitiesAndShowsThemAgain) {
     ASSERT_TRUE(terminal.showsNoMore(kIccid));
     ASSERT_TRUE(terminal.shows("safe"));
     openSim();
-    ASSERT_TRUE(terminal.shows("0000000000000000000"));
+    ASSERT_TRUE(terminal.shows(kMaskedIccid));
     terminal.type(",");
     ASSERT_TRUE(terminal.shows("held"));
-    ASSERT_TRUE(terminal.shows("0000000000000000000"));
+    ASSERT_TRUE(terminal.shows(kMaskedIccid));
     EXPECT_TRUE(terminal.showsNoMore(kIccid));
     terminal.type(";select count(*) as found from sample where text like '8949%'\r");
     ASSERT_TRUE(terminal.shows("1 row"));
@@ -215,7 +202,7 @@ TEST_F(EndToEndSafe, TheKeyHidesTheIdentitiesOfAllModems) {
     (void)terminal.settled();
     const std::size_t begin = terminal.bytes().size();
     openBoth();
-    ASSERT_TRUE(terminal.shows("0000000000000000000"));
+    ASSERT_TRUE(terminal.shows(kMaskedIccid));
     (void)terminal.settled();
     expectNoIdentity(terminal, begin);
 }

@@ -19,8 +19,6 @@ using doubles::getRequest;
 using doubles::HttpClient;
 using doubles::PallaxProcess;
 
-constexpr const char* kIccid = "8949020000012345670";
-
 TEST_F(EndToEndWeb, TheStateAtTheEndIsThatOfDecode) {
     const std::string path = gsmAttach();
     PallaxProcess web(world, {"web", path, "--speed", "max", "--with-identities"});
@@ -54,13 +52,9 @@ TEST_F(EndToEndWeb, ServesThePageOfAStore) {
 
 TEST_F(EndToEndWeb, MasksIdentitiesUnlessToldOtherwise) {
     using std::chrono::milliseconds;
-    const std::string path =
-        record("sim.pcap",
-               {{milliseconds(0), registration(1)},
-                {milliseconds(500),
-                 doubles::textRecord(kSimFiles, std::string("{kSimFile_ICCID = ") + kIccid + ";}")
-                     .prefixed()},
-                {milliseconds(3000), registration(2)}});
+    const std::string path = record("sim.pcap", {{milliseconds(0), registration(1)},
+                                                 {milliseconds(500), simFiles()},
+                                                 {milliseconds(3000), registration(2)}});
     for (const bool withIdentities : {false, true}) {
         std::vector<std::string> arguments{"web", path, "--speed", "max"};
         if (withIdentities) {

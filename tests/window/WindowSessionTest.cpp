@@ -1,32 +1,17 @@
 #include "window/WindowSession.h"
 
 #include "tests/cli/EndToEnd.h"
-#include "tests/doubles/PropertyListRecord.h"
 #include "tests/window/SessionStage.h"
 
 namespace pallax {
 namespace {
 
-using std::chrono::milliseconds;
-
 class WindowSessionTest : public EndToEnd {
 protected:
-    static constexpr const char* kIccid = "8949020000012345670";
-    static constexpr const char* kMaskedIccid = "0000000000000000000";
-
     void SetUp() override {
         if (!doubles::openXDisplay()) {
             GTEST_SKIP() << "Xvfb is not installed";
         }
-    }
-    std::string withSim() const {
-        return record("sim.pcap",
-                      {{milliseconds(0), registration(1)},
-                       {milliseconds(500),
-                        doubles::textRecord(kSimFiles, std::string("{kSimFile_ICCID = ") + kIccid +
-                                                           "; kSimFile_PNN = Net;}")
-                            .prefixed()},
-                       {milliseconds(3000), registration(2)}});
     }
 };
 
