@@ -9,7 +9,8 @@
 
 namespace pallax {
 
-/// Programs that run beside this one. They outlive the object, but nothing is told of them then.
+/// Programs that run beside this one. They may outlive the object, which then says
+/// nothing about them.
 class Programs {
 public:
     /// The queue must outlive the object.

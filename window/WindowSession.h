@@ -62,7 +62,7 @@ private:
     ViewerSession::Face face();
     ShownValues::Source valueSource();
     gtk::TimeBar::Actions timeActions();
-    /// False if it was refused, which the user is told.
+    /// Tells the user if it was refused, and returns false.
     bool travel(const std::function<Travel::Refusal(Travel&)>& action);
     void wish(gtk::TimeBar::Wish wish);
     void goTo(const std::string& place);

@@ -95,7 +95,7 @@ protected:
                                "Activate", g_variant_new_parsed("(@a{sv} {},)"), nullptr,
                                G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr, nullptr);
         ASSERT_TRUE(g_dbus_connection_flush_sync(_desktop.get(), nullptr, nullptr));
-        g_variant_unref(g_dbus_connection_call_sync( // an answer from behind it
+        g_variant_unref(g_dbus_connection_call_sync( // answered after the call above
             _desktop.get(), "org.freedesktop.DBus", "/org/freedesktop/DBus", "org.freedesktop.DBus",
             "GetId", nullptr, nullptr, G_DBUS_CALL_FLAGS_NONE, -1, nullptr, nullptr));
     }

@@ -12,7 +12,7 @@ namespace {
 
 using Words = std::vector<std::string>;
 
-/// What is told once the script of a shell has ended.
+/// Runs a shell script to its end and returns what the user is told of it.
 std::string told(const std::string& script) {
     doubles::SteppedQueue queue;
     Programs programs(queue);

@@ -35,7 +35,7 @@ Messages::Messages(const Guard& guard) : _guard(guard) {
                  [guard = _guard, alive = std::weak_ptr<Messages*>(_alive)] {
                      guard.queue().async([alive] {
                          if (const auto self = alive.lock()) {
-                             (*self)->place();
+                             (*self)->showAtPlace();
                          }
                      });
                  });
@@ -47,18 +47,18 @@ void Messages::show(const std::string& text) {
         gtk_label_set_text(GTK_LABEL(each->label), shownText(text).c_str());
     }
     _isShowing = true;
-    place();
+    showAtPlace();
     _guard.queue().after(kLength, [alive = std::weak_ptr<Messages*>(_alive), number = ++_shown] {
         const auto self = alive.lock();
         if (self && (*self)->_shown == number) {
             (*self)->_isShowing = false;
-            (*self)->place();
+            (*self)->showAtPlace();
         }
     });
 }
 
 /// One of the two, for screen readers would tell both.
-void Messages::place() {
+void Messages::showAtPlace() {
     const bool arePanesSeen = gtk_widget_get_mapped(GTK_WIDGET(panes())) != FALSE;
     gtk_widget_set_visible(_panes.label, _isShowing && arePanesSeen ? TRUE : FALSE);
     gtk_widget_set_visible(_window.label, _isShowing && !arePanesSeen ? TRUE : FALSE);

@@ -33,7 +33,8 @@ private:
         GtkWidget* label; ///< the overlay owns it
     };
 
-    void place();
+    /// Shows the label at the place that is visible.
+    void showAtPlace();
 
     Guard _guard;
     Place _window;

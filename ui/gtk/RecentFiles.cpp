@@ -152,7 +152,7 @@ void RecentFiles::refresh() {
     const Ref<GMenu> names(g_menu_new());
     for (const std::string& path : files) {
         const Ref<GMenuItem> item(g_menu_item_new(entryOf(path).c_str(), nullptr));
-        // Its bytes: a name need not be UTF-8.
+        // As bytes, because a file name need not be UTF-8.
         g_menu_item_set_action_and_target(item.get(), "recent.open", "^ay", path.c_str());
         g_menu_append_item(names.get(), item.get());
     }
