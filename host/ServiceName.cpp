@@ -7,7 +7,7 @@ namespace pallax {
 
 namespace {
 
-bool isAllowed(char character) {
+bool isNameCharacter(char character) {
     return (character >= 'a' && character <= 'z') || (character >= 'A' && character <= 'Z') ||
            (character >= '0' && character <= '9') || character == '-' || character == '_' ||
            character == '.';
@@ -18,7 +18,7 @@ bool isAllowed(char character) {
 bool isServiceName(std::string_view text) {
     constexpr std::size_t kLongest = 32;
     return !text.empty() && text.size() <= kLongest && text.front() != '-' && text.front() != '.' &&
-           std::all_of(text.begin(), text.end(), isAllowed);
+           std::all_of(text.begin(), text.end(), isNameCharacter);
 }
 
 std::string liveModemName(std::string_view service) {
