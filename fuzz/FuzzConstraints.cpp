@@ -5,7 +5,7 @@
 
 #include "fuzz/QueryTimeline.h"
 #include "query/QueryTable.h"
-#include "query/SqlTokens.h"
+#include "query/SqlText.h"
 
 #include <algorithm>
 #include <array>

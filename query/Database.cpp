@@ -4,6 +4,7 @@
 #include "query/Quantile.h"
 #include "query/QueryMemory.h"
 #include "query/QueryTable.h"
+#include "query/SqlText.h"
 #include "query/VirtualTable.h"
 
 #include <algorithm>
@@ -233,7 +234,7 @@ void Database::add(const std::string& schema, const std::string& name,
     sqlite3_set_authorizer(_connection.get(), nullptr, nullptr);
     run(*_connection, "PRAGMA query_only = false");
     if (std::find(_schemas.begin(), _schemas.end(), schema) == _schemas.end()) {
-        run(*_connection, "ATTACH ':memory:' AS \"" + schema + "\"");
+        run(*_connection, "ATTACH ':memory:' AS " + quotedName(schema));
         _schemas.push_back(schema);
     }
     _names.push_back(name);
@@ -242,7 +243,7 @@ void Database::add(const std::string& schema, const std::string& name,
     }
     _tables.push_back({schema, name, std::move(table)});
     _added.push_back(std::make_unique<AddedTable>(AddedTable{*_tables.back().table, *_authority}));
-    const std::string qualified = "\"" + schema + "\".\"" + name + "\"";
+    const std::string qualified = quotedName(schema) + "." + quotedName(name);
     if (!addVirtualTable(*_connection, qualified.c_str(), *_added.back())) {
         throw std::runtime_error(sqlite3_errmsg(_connection.get()));
     }

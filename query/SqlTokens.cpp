@@ -68,14 +68,6 @@ std::size_t wordEnd(std::string_view text, std::size_t place) {
 
 } // namespace
 
-std::string quotedName(std::string_view name) {
-    std::string text = "\"";
-    for (const char character : name) {
-        text.append(character == '"' ? 2 : 1, character);
-    }
-    return text + "\"";
-}
-
 std::optional<SqlToken> sqlTokenAt(std::string_view text, std::size_t place) {
     if (place >= text.size()) {
         return std::nullopt;

@@ -2,7 +2,6 @@
 
 #include <cstddef>
 #include <optional>
-#include <string>
 #include <string_view>
 
 namespace pallax {
@@ -21,9 +20,6 @@ struct SqlToken {
     std::size_t end = 0;
     bool isClosed = true; ///< false of a comment, text or name that the end of the input cuts
 };
-
-/// A name in double quotes, with which it may be any text.
-std::string quotedName(std::string_view name);
 
 /// The token at a place of a text; nothing at its end.
 std::optional<SqlToken> sqlTokenAt(std::string_view text, std::size_t place);

@@ -1,7 +1,7 @@
 #include "query/VirtualTable.h"
 
 #include "query/QueryTable.h"
-#include "query/SqlTokens.h"
+#include "query/SqlText.h"
 
 #include <algorithm>
 #include <charconv>

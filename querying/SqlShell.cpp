@@ -2,6 +2,7 @@
 
 #include "console/Output.h"
 #include "query/QueryTable.h"
+#include "query/SqlText.h"
 #include "querying/LineReader.h"
 #include "querying/QueryRun.h"
 #include "text/Format.h"
@@ -37,15 +38,6 @@ std::string withoutBlanks(const std::string& text) {
 
 std::string tableName(const Database::Table& table) {
     return table.schema == "main" ? table.name : table.schema + "." + table.name;
-}
-
-/// A text of SQL.
-std::string literal(std::string_view text) {
-    std::string quoted = "'";
-    for (const char character : text) {
-        quoted.append(character == '\'' ? 2 : 1, character);
-    }
-    return quoted + "'";
 }
 
 constexpr std::pair<std::string_view, RowFormat> kModes[] = {
@@ -149,7 +141,7 @@ void SqlShell::runCommand(const std::string& line) {
         showSchema(argument);
     } else if (name == ".fields") {
         runQuery("select name, unit, meaning from field where name glob " +
-                 literal(argument.empty() ? "*" : argument));
+                 quotedText(argument.empty() ? "*" : argument));
     } else if (name == ".mode") {
         setMode(argument);
     } else if (name == ".help") {

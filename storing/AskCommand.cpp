@@ -10,6 +10,7 @@
 #include "query/Functions.h"
 #include "query/LabelFunction.h"
 #include "query/QueryTable.h"
+#include "query/SqlText.h"
 #include "querying/QueryRun.h"
 #include "store/StoreConnection.h"
 #include "store/StoredSections.h"
@@ -160,7 +161,7 @@ private:
     }
     static AskedSection sectionOf(const Database::Table& table) {
         AskedSection section;
-        section.table = table.schema + ".\"" + table.name + "\"";
+        section.table = table.schema + "." + quotedName(table.name);
         for (const Column& column : table.columns) {
             section.isList = section.isList || (column.name == "entry" && !column.isHidden);
             if (column.role == Column::Role::Value) {

@@ -2,6 +2,7 @@
 
 #include "fields/Measures.h"
 #include "fields/StatusFields.h"
+#include "query/SqlText.h"
 #include "text/Date.h"
 #include "text/Format.h"
 
@@ -294,14 +295,6 @@ std::string borderOf(const JudgedLevel& level, Grade grade) {
     return text;
 }
 
-std::string quotedText(const std::string& text) {
-    std::string quoted = "'";
-    for (const char character : text) {
-        quoted.append(character == '\'' ? 2 : 1, character);
-    }
-    return quoted + "'";
-}
-
 std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<double> below,
                                       const QualityProfile& profile) {
     std::vector<JudgedLevel> levels;
@@ -361,7 +354,7 @@ std::string sectionQuery(const StoreAskOptions& options, const AskedSection& sec
     query += section.isList ? "entry, " : "";
     query += "round(hold / 1e6, 3) AS seconds";
     for (const std::string& field : section.fields) {
-        query += ", \"" + field + "\"";
+        query += ", " + quotedName(field);
     }
     query += " FROM " + section.table + " WHERE true";
     constexpr std::int64_t kMicroseconds = 1000;

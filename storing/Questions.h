@@ -24,9 +24,6 @@ struct JudgedLevel {
 std::vector<JudgedLevel> judgedLevels(const std::string& choice, std::optional<double> below,
                                       const QualityProfile& profile);
 
-/// A text as SQL has it.
-std::string quotedText(const std::string& text);
-
 /// As SQL has it.
 std::string sqlNumber(double number);
 

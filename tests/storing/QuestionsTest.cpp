@@ -75,11 +75,6 @@ TEST(JudgedLevels, AreThoseOfAMeasureOrOfAFieldOrNone) {
     EXPECT_TRUE(judgedLevels("colour", {}, android()).empty());
 }
 
-TEST(QuotedText, IsTheTextForSql) {
-    EXPECT_EQ(quotedText("it's"), "'it''s'");
-    EXPECT_EQ(quotedText(""), "''");
-}
-
 TEST(SectionQuery, HasTheFieldsBetweenTimeAndOrigin) {
     StoreAskOptions options;
     AskedSection section;
