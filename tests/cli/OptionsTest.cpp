@@ -2,8 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <filesystem>
-#include <fstream>
 #include <regex>
 #include <sstream>
 
@@ -341,155 +339,17 @@ TEST(Options, HelpAndVersionGoToStandardOutputEverywhere) {
     EXPECT_NE(ended({"decode", "--help"}).text.find("--every end|tick|packet"), std::string::npos);
 }
 
-std::string wrongUsage(std::vector<std::string> arguments) {
-    const ParseEnd end = ended(std::move(arguments));
-    EXPECT_EQ(end.status, kExitWrongUsage);
-    EXPECT_EQ(end.text.find('\n'), end.text.size() - 1) << "one line: " << end.text;
-    return end.text;
-}
-
-TEST(Options, WrongUsageIsOneClearSentence) {
-    EXPECT_EQ(
-        wrongUsage({"decode", "--every", "day", "a"}),
-        "pallax: --every: \"day\" is not one of end|tick|packet (see pallax decode --help)\n");
-    EXPECT_EQ(wrongUsage({"--speed", "0", "a"}),
-              "pallax: --speed: \"0\" is neither a number above 0 nor max (see pallax --help)\n");
-    EXPECT_EQ(wrongUsage({"decode"}), "pallax: RECORDING is required (see pallax decode --help)\n");
-    EXPECT_EQ(wrongUsage({"service"}),
-              "pallax: the service needs --play, --simulate, --relay, --modem, --status "
-              "or --list (see pallax service --help)\n");
-    EXPECT_EQ(wrongUsage({"a", "decode", "b"}), "pallax: the command \"decode\" must come first, "
-                                                "without options before it (see pallax --help)\n");
-    EXPECT_EQ(wrongUsage({"--print", "decode", "b"}),
-              "pallax: the command \"decode\" must come first, without options before it (see "
-              "pallax --help)\n");
-}
-
-TEST(Options, WrongUsageOfTheServiceAndTheRecorderIsOneClearSentence) {
-    EXPECT_EQ(
-        wrongUsage({"service", "--relay", "a.pcap"}),
-        "pallax: --relay: only -, standard input, can be relayed (see pallax service --help)\n");
-    for (const char* wait : {"-1", "1000001", "nan", ""}) {
-        EXPECT_EQ(
-            wrongUsage({"service", "--relay", "-", "--wait", wait}),
-            "pallax: --wait: must be a number from 0 to 1000000 (see pallax service --help)\n");
-    }
-    EXPECT_EQ(wrongUsage({"service", "--play", "a.pcap", "--wait", "1"}),
-              "pallax: --wait requires --relay (see pallax service --help)\n");
-    EXPECT_EQ(wrongUsage({"service", "--relay", "-", "--play", "a"}),
-              "pallax: --play excludes --relay (see pallax service --help)\n");
-    EXPECT_EQ(wrongUsage({"service", "--status", "--play", "a"}),
-              "pallax: --play excludes --status (see pallax service --help)\n");
-    EXPECT_EQ(wrongUsage({"record"}), "pallax: FILE is required (see pallax record --help)\n");
-    EXPECT_EQ(wrongUsage({"record", "--rotate-size", "big", "a"}),
-              "pallax: --rotate-size: \"big\" is not a size such as 4096, 64k, 100M or 2G (see "
-              "pallax record --help)\n");
-    EXPECT_EQ(wrongUsage({"record", "--rotate-size", "0", "a"}),
-              "pallax: --rotate-size: \"0\" is out of range, which is from 1 to 17179869183G "
-              "(see pallax record --help)\n");
-    EXPECT_EQ(wrongUsage({"record", "--rotate-seconds", "long", "a"}),
-              "pallax: --rotate-seconds: \"long\" is not a number of seconds (see pallax record "
-              "--help)\n");
-    EXPECT_EQ(wrongUsage({"record", "--rotate-seconds", "1e10", "a"}),
-              "pallax: --rotate-seconds: \"1e10\" is out of range, which is above 0 and up to "
-              "1000000000 (see pallax record --help)\n");
-    EXPECT_EQ(wrongUsage({"record", ""}),
-              "pallax: FILE is an empty name (see pallax record --help)\n");
-    EXPECT_EQ(wrongUsage({"record", "--rotate-size", "1M", "-"}),
-              "pallax: standard output is one recording, without --rotate-size and "
-              "--rotate-seconds (see pallax record --help)\n");
-}
-
-TEST(Options, WrongArgumentsAreNamed) {
-    EXPECT_NE(wrongUsage({"--colour", "red"}).find("--colour"), std::string::npos);
-    EXPECT_NE(wrongUsage({"a.pcap", "b.pcap"}).find("b.pcap"), std::string::npos);
-    EXPECT_EQ(wrongUsage({"--loop"}), "pallax: --loop requires RECORDING (see pallax --help)\n");
-    EXPECT_NE(wrongUsage({"--log-level", "8"}).find("--log-level"), std::string::npos);
-    EXPECT_NE(wrongUsage({"decode", "--technology", "5g", "a"}).find("ifx|gsm|cdma|lte|utran"),
-              std::string::npos);
-    for (const char* speed : {"-1", "nan", "inf", "fast", "1x", ""}) {
-        EXPECT_NE(wrongUsage({"--speed", speed, "a"}).find("--speed"), std::string::npos);
-    }
-}
-
-TEST(Options, AMistypedCommandOrChoiceIsAnsweredWithTheNearest) {
-    EXPECT_EQ(wrongUsage({"decod", "x"}),
-              "pallax: \"decod\" is neither a command nor a recording. Did you mean \"decode\"? "
-              "(see pallax --help)\n");
-    EXPECT_EQ(wrongUsage({"dmeo"}),
-              "pallax: \"dmeo\" is neither a command nor a recording. Did you mean \"demo\"? "
-              "(see pallax --help)\n");
-    EXPECT_EQ(wrongUsage({"simulate", "ltee"}),
-              "pallax: TECHNOLOGY: \"ltee\" is not one of ifx|gsm|cdma|lte|utran. Did you mean "
-              "\"lte\"? (see pallax simulate --help)\n");
-    EXPECT_EQ(wrongUsage({"decode", "--every", "tcik", "a"}),
-              "pallax: --every: \"tcik\" is not one of end|tick|packet. Did you mean \"tick\"? "
-              "(see pallax decode --help)\n");
-    EXPECT_EQ(recordingPath(parsed<BrowseOptions>({"drive"}).source), "drive") << "no similar word";
-}
-
-TEST(Options, ARecordingNamedNearlyLikeACommandIsBrowsed) {
-    const std::string here = std::filesystem::current_path();
-    const std::string folder = testing::TempDir() + "pallax-options";
-    std::filesystem::create_directories(folder);
-    std::filesystem::current_path(folder);
-    std::ofstream("decod") << "a recording";
-    EXPECT_EQ(recordingPath(parsed<BrowseOptions>({"decod"}).source), "decod");
-    std::filesystem::current_path(here);
-    std::filesystem::remove_all(folder);
-}
-
 TEST(Options, CompletionAndManualAreTextsThatTheHelpDoesNotName) {
     const ParseEnd script = ended({"completion", "bash"});
     EXPECT_EQ(script.status, kExitSuccess);
     EXPECT_NE(script.text.find("complete -F _pallax pallax\n"), std::string::npos);
-    EXPECT_EQ(wrongUsage({"completion", "csh"}),
+    EXPECT_EQ(refusalOf({"completion", "csh"}),
               "pallax: SHELL: \"csh\" is not one of bash|zsh|fish. Did you mean \"zsh\"? (see "
               "pallax completion --help)\n");
-    EXPECT_EQ(wrongUsage({"manual"}), "pallax: PAGE is required (see pallax manual --help)\n");
+    EXPECT_EQ(refusalOf({"manual"}), "pallax: PAGE is required (see pallax manual --help)\n");
     const std::string help = ended({"--help"}).text;
     EXPECT_EQ(help.find("completion"), std::string::npos);
     EXPECT_EQ(help.find("manual"), std::string::npos);
-}
-
-TEST(Options, StandardInputCannotBeLooped) {
-    EXPECT_EQ(
-        wrongUsage({"-", "--loop"}),
-        "pallax: standard input can be played only once, not with --loop (see pallax --help)\n");
-    EXPECT_EQ(wrongUsage({"service", "--play", "-", "--loop"}),
-              "pallax: standard input can be played only once, not with --loop (see pallax service "
-              "--help)\n");
-}
-
-LocalModem modemOf(const Source& source) {
-    const auto* modem = std::get_if<LocalModem>(&source);
-    return modem != nullptr ? *modem : LocalModem{"none"};
-}
-
-TEST(Options, AModemIsTheFirstOneOrNamed) {
-    EXPECT_EQ(modemOf(parsed<BrowseOptions>({"modem"}).source).wanted, "auto");
-    EXPECT_EQ(modemOf(parsed<BrowseOptions>({"modem", "AT-9"}).source).wanted, "AT-9");
-    EXPECT_FALSE(modemOf(parsed<BrowseOptions>({"modem"}).source).withIdentities);
-    EXPECT_TRUE(
-        modemOf(parsed<BrowseOptions>({"modem", "--with-identities"}).source).withIdentities);
-    EXPECT_EQ(modemOf(parsed<ServiceOptions>({"service", "--modem"}).source).wanted, "auto");
-    EXPECT_EQ(modemOf(parsed<ServiceOptions>({"service", "--modem", "1"}).source).wanted, "1");
-    EXPECT_EQ(parsed<RecordOptions>({"record", "--modem", "a.pcapng"}).modem->wanted, "auto");
-    EXPECT_EQ(parsed<RecordOptions>({"record", "--modem", "a.pcapng"}).files.path, "a.pcapng");
-    EXPECT_EQ(parsed<RecordOptions>({"record", "--modem", "1", "a.pcapng"}).modem->wanted, "1");
-    EXPECT_EQ(parsed<RecordOptions>({"record", "a.pcapng", "--modem"}).modem->wanted, "auto");
-    EXPECT_FALSE(parsed<RecordOptions>({"record", "a.pcapng"}).modem);
-    (void)parsed<ModemListOptions>({"modem", "--list"});
-    (void)parsed<ModemPolicyOptions>({"modem", "--policy"});
-}
-
-TEST(Options, AModemHasNoOtherSource) {
-    EXPECT_EQ(wrongUsage({"modem", "--list", "--policy"}),
-              "pallax: --list excludes --policy (see pallax modem --help)\n");
-    EXPECT_EQ(wrongUsage({"service", "--with-identities"}),
-              "pallax: --with-identities requires --modem (see pallax service --help)\n");
-    EXPECT_EQ(wrongUsage({"service", "--modem", "--play", "a"}),
-              "pallax: --play excludes --modem (see pallax service --help)\n");
 }
 
 } // namespace

@@ -31,4 +31,12 @@ inline ParseEnd ended(std::vector<std::string> arguments) {
     return end != nullptr ? *end : ParseEnd{};
 }
 
+/// The sentence about arguments that are wrong.
+inline std::string refusalOf(std::vector<std::string> arguments) {
+    const ParseEnd end = ended(std::move(arguments));
+    EXPECT_EQ(end.status, kExitWrongUsage);
+    EXPECT_EQ(end.text.find('\n'), end.text.size() - 1) << "one line: " << end.text;
+    return end.text;
+}
+
 } // namespace pallax
