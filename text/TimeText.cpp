@@ -328,16 +328,18 @@ std::optional<Time> TimeText::firstIn(const TimeSpan::Stretch& stretch,
                                       const ZoneRule& zone) const {
     const auto today = std::chrono::floor<std::chrono::days>(stretch.begin + zone(stretch.begin))
                            .time_since_epoch();
-    std::optional<Time> first;
+    std::optional<std::pair<bool, Time>> first; // on a day whose clock skips it, only if need be
     // Each day has the time, so the first that fits is near, or none does.
     for (int day = -1; day <= 2; ++day) {
-        for (const Time time : timesOfLocal(today + std::chrono::days(day) + _size, zone)) {
-            if (time >= stretch.begin && time <= stretch.end && (!first || time < *first)) {
-                first = time;
+        const nanoseconds local = today + std::chrono::days(day) + _size;
+        for (const Time time : timesOfLocal(local, zone)) {
+            const std::pair found(time + zone(time) != kEarliestTime + local, time);
+            if (time >= stretch.begin && time <= stretch.end && (!first || found < *first)) {
+                first = found;
             }
         }
     }
-    return first;
+    return first ? std::optional(first->second) : std::nullopt;
 }
 
 } // namespace pallax

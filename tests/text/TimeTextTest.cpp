@@ -156,6 +156,12 @@ TEST_F(TimeTextTest, WhereTheClockChangesTheFirstTimeIsMeant) {
     EXPECT_EQ(timeOf("2023-03-26T03:00"), "2023-03-26T01:00:00.000Z");
     EXPECT_EQ(timeOf("2023-10-29T02:30"), "2023-10-29T00:30:00.000Z"); // twice
     EXPECT_EQ(timeOf("2023-10-29T03:00"), "2023-10-29T02:00:00.000Z");
+    // A day whose clock skips the time is meant only if no other has it.
+    span = {at("2023-03-25T14:00:00Z"), at("2023-03-27T18:00:00Z")};
+    EXPECT_EQ(timeOf("2:00"), "2023-03-27T00:00:00.000Z");
+    EXPECT_EQ(timeOf("2:30"), "2023-03-27T00:30:00.000Z");
+    span.end = at("2023-03-26T20:00:00Z");
+    EXPECT_EQ(timeOf("2:30"), "2023-03-26T01:30:00.000Z");
     // The second of the two, where the first lies before the recording.
     span = {at("2023-10-29T00:45:00Z"), at("2023-10-29T02:00:00Z")};
     EXPECT_EQ(timeOf("2:30"), "2023-10-29T01:30:00.000Z");
