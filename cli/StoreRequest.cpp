@@ -98,8 +98,6 @@ Exit status:
   1   failure: the store failed, or a recording was refused or is damaged
   2   wrong usage, or a wrong query)";
 
-using Question = StoreAskOptions::Question;
-
 void addLoading(CLI::App& app, StoreRequest& request) {
     app.add_option("--device", request.loading.device,
                    "The device of the recordings; of a question, only this device")
@@ -179,12 +177,12 @@ void addAsking(CLI::App& app, StoreAskOptions& asking) {
 }
 
 /// The question of the first word, and how many words follow it.
-const std::vector<std::pair<std::string, std::pair<Question, std::size_t>>>& questions() {
-    static const std::vector<std::pair<std::string, std::pair<Question, std::size_t>>> all{
-        {"devices", {Question::Devices, 0}},  {"recordings", {Question::Recordings, 0}},
-        {"cells", {Question::Cells, 0}},      {"series", {Question::Series, 1}},
-        {"section", {Question::Section, 1}},  {"compare", {Question::Compare, 2}},
-        {"coverage", {Question::Coverage, 0}}};
+const std::vector<std::pair<std::string, std::pair<StoreQuestion, std::size_t>>>& questions() {
+    static const std::vector<std::pair<std::string, std::pair<StoreQuestion, std::size_t>>> all{
+        {"devices", {StoreQuestion::Devices, 0}},  {"recordings", {StoreQuestion::Recordings, 0}},
+        {"cells", {StoreQuestion::Cells, 0}},      {"series", {StoreQuestion::Series, 1}},
+        {"section", {StoreQuestion::Section, 1}},  {"compare", {StoreQuestion::Compare, 2}},
+        {"coverage", {StoreQuestion::Coverage, 0}}};
     return all;
 }
 

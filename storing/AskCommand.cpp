@@ -30,8 +30,6 @@ namespace pallax {
 
 namespace {
 
-using Question = StoreAskOptions::Question;
-
 /// The rows of a query that the program itself asks.
 std::vector<std::vector<QueryValue>> rowsOf(Database& database, const std::string& query) {
     auto prepared = database.prepare(query);
@@ -100,7 +98,7 @@ public:
 
 private:
     std::string queryFor(const AskedTime& time, ServerStore* store) {
-        if (_options.question == Question::Section) {
+        if (_options.question == StoreQuestion::Section) {
             return sectionQuery(_options, _section, time);
         }
         return store != nullptr ? addServerQuestion(_database, *store, _options, _levels, time)
@@ -108,10 +106,10 @@ private:
     }
     /// Why there are none; nothing if the question needs none.
     std::optional<std::string> findLevels() {
-        if (_options.question == Question::Series) {
+        if (_options.question == StoreQuestion::Series) {
             return findField(_options.words.front());
         }
-        if (_options.question == Question::Section) {
+        if (_options.question == StoreQuestion::Section) {
             return findSection(_options.words.front());
         }
         _levels = judgedLevels(_options.levels, _options.below, _profile);
@@ -254,19 +252,19 @@ ExitStatus askFile(const StoreAskOptions& options, const QualityProfile& profile
     }
     FileTechnologies technologies; // outlive the database
     Database database(file);
-    if (options.question == Question::Sql || options.question == Question::Section) {
+    if (options.question == StoreQuestion::Sql || options.question == StoreQuestion::Section) {
         technologies.addTo(database, file);
     }
     return Ask(options, database, profile).run(nullptr);
 }
 
 ExitStatus askAddress(const StoreAskOptions& options, const QualityProfile& profile) {
-    if (options.question == Question::Section) {
+    if (options.question == StoreQuestion::Section) {
         complain("Only a file has sections: ask a server with --sql.");
         return kExitWrongUsage;
     }
     ServerStore store(parseStoreAddress(options.store), patienceOf(options));
-    if (options.question == Question::Sql) {
+    if (options.question == StoreQuestion::Sql) {
         return askServer(store, options);
     }
     Database database;

@@ -335,13 +335,13 @@ std::int64_t stepOf(const StoreAskOptions& options) {
 
 std::string answerOf(const StoreAskOptions& options) {
     switch (options.question) {
-    case StoreAskOptions::Question::Cells:
+    case StoreQuestion::Cells:
         return cellsAnswer();
-    case StoreAskOptions::Question::Series:
+    case StoreQuestion::Series:
         return withStep(kSeriesAnswer, options);
-    case StoreAskOptions::Question::Compare:
+    case StoreQuestion::Compare:
         return compareAnswer(options);
-    case StoreAskOptions::Question::Coverage:
+    case StoreQuestion::Coverage:
         return coverageAnswer();
     default:
         return queryOf(options, {}, {}); // of the table `recordings`
@@ -367,26 +367,26 @@ std::string sectionQuery(const StoreAskOptions& options, const AskedSection& sec
 std::string queryOf(const StoreAskOptions& options, const std::vector<JudgedLevel>& levels,
                     const AskedTime& time) {
     switch (options.question) {
-    case StoreAskOptions::Question::Devices:
+    case StoreQuestion::Devices:
         return "SELECT device, count(*) AS recordings, time_text(min(first) * 1000) AS first, "
                "time_text(max(last) * 1000) AS last, round(sum(last - first) / 3.6e6, 3) AS hours, "
                "sum(packets) AS packets FROM recordings r WHERE true" +
                onlyDevice(options) + " GROUP BY device ORDER BY device";
-    case StoreAskOptions::Question::Recordings:
+    case StoreQuestion::Recordings:
         return "SELECT device, name, technology, time_text(first * 1000) AS first, "
                "time_text(last * 1000) AS last, packets, every, identities, decoder, trouble "
                "FROM recordings r WHERE true" +
                onlyDevice(options) + " ORDER BY device, first, name";
-    case StoreAskOptions::Question::Cells:
+    case StoreQuestion::Cells:
         return cellsQuery(options, levels, time);
-    case StoreAskOptions::Question::Series:
+    case StoreQuestion::Series:
         return seriesQuery(options, levels, time);
-    case StoreAskOptions::Question::Compare:
+    case StoreQuestion::Compare:
         return compareQuery(options, levels, time);
-    case StoreAskOptions::Question::Coverage:
+    case StoreQuestion::Coverage:
         return coverageQuery(options, levels, time);
-    case StoreAskOptions::Question::Section:
-    case StoreAskOptions::Question::Sql:
+    case StoreQuestion::Section:
+    case StoreQuestion::Sql:
         break;
     }
     return options.words.at(0);

@@ -82,10 +82,9 @@ bool isTrouble(const ServerRefusal& refusal) {
 } // namespace
 
 void addServerTables(Database& database, ServerStore& store, const StoreAskOptions& options) {
-    using Question = StoreAskOptions::Question;
     addTable(database, store, {"field", {"name", "in_list"}, "SELECT name, in_list FROM field"});
     const bool isList =
-        options.question == Question::Devices || options.question == Question::Recordings;
+        options.question == StoreQuestion::Devices || options.question == StoreQuestion::Recordings;
     if (isList) {
         addTable(database, store,
                  {"recordings",

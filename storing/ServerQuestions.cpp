@@ -229,15 +229,14 @@ ServerQuestion seriesQuestion(const StoreAskOptions& options,
 ServerQuestion serverQuestion(const StoreAskOptions& options,
                               const std::vector<JudgedLevel>& levels, const AskedTime& time,
                               const ServerStore& store) {
-    using Question = StoreAskOptions::Question;
     switch (options.question) {
-    case Question::Cells:
+    case StoreQuestion::Cells:
         return cellsQuestion(options, levels, time, store);
-    case Question::Series:
+    case StoreQuestion::Series:
         return seriesQuestion(options, levels, time, store);
-    case Question::Compare:
+    case StoreQuestion::Compare:
         return compareQuestion(options, levels, time, store);
-    case Question::Coverage:
+    case StoreQuestion::Coverage:
         return coverageQuestion(options, levels, time, store);
     default:
         return {{}, answerOf(options)}; // on `recordings`, which is always there

@@ -41,12 +41,12 @@ struct StoreSetupOptions {
     StoreLayout layout = {};
 };
 
+enum class StoreQuestion { Devices, Recordings, Cells, Series, Section, Compare, Coverage, Sql };
+
 /// `pallax store query`.
 struct StoreAskOptions {
-    enum class Question { Devices, Recordings, Cells, Series, Section, Compare, Coverage, Sql };
-
     std::string store; ///< as for loading
-    Question question = Question::Sql;
+    StoreQuestion question = StoreQuestion::Sql;
     /// The field of a series, the name of a section, the two that are compared, or the query.
     std::vector<std::string> words = {};
     std::optional<std::string> device = {};

@@ -3,8 +3,6 @@
 namespace pallax {
 namespace {
 
-using Question = StoreAskOptions::Question;
-
 std::string refusal(std::vector<std::string> arguments) {
     const ParseEnd end = ended(std::move(arguments));
     EXPECT_EQ(end.status, kExitWrongUsage);
@@ -33,7 +31,7 @@ TEST(StoreOptions, QueryTakesAQuestion) {
     const auto series = parsed<StoreAskOptions>({"store", "query", "series", "rsrp", "--device",
                                                  "car1", "--every", "6h", "--entry", "PCI 1",
                                                  "--store", "fleet.db", "--format", "csv"});
-    EXPECT_EQ(series.question, Question::Series);
+    EXPECT_EQ(series.question, StoreQuestion::Series);
     EXPECT_EQ(series.words, std::vector<std::string>{"rsrp"});
     EXPECT_EQ(series.device, "car1");
     EXPECT_EQ(series.every, std::chrono::hours(6));
@@ -42,7 +40,7 @@ TEST(StoreOptions, QueryTakesAQuestion) {
     EXPECT_EQ(series.format, RowFormat::Csv);
     const auto cells = parsed<StoreAskOptions>(
         {"store", "query", "cells", "--below", "-110", "--level", "rsrp", "--profile", "field"});
-    EXPECT_EQ(cells.question, Question::Cells);
+    EXPECT_EQ(cells.question, StoreQuestion::Cells);
     EXPECT_EQ(cells.below, -110.0);
     EXPECT_EQ(cells.levels, "rsrp");
     EXPECT_EQ(cells.profile, "field");
@@ -50,14 +48,16 @@ TEST(StoreOptions, QueryTakesAQuestion) {
               (std::vector<std::string>{"a", "b"}));
     const auto section = parsed<StoreAskOptions>(
         {"store", "query", "section", "lte.x", "--entry", "PCI 1", "--from", "start"});
-    EXPECT_EQ(section.question, Question::Section);
+    EXPECT_EQ(section.question, StoreQuestion::Section);
     EXPECT_EQ(section.words, std::vector<std::string>{"lte.x"});
-    EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "devices"}).question, Question::Devices);
+    EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "devices"}).question,
+              StoreQuestion::Devices);
     EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "recordings"}).question,
-              Question::Recordings);
-    EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "coverage"}).question, Question::Coverage);
+              StoreQuestion::Recordings);
+    EXPECT_EQ(parsed<StoreAskOptions>({"store", "query", "coverage"}).question,
+              StoreQuestion::Coverage);
     const auto sql = parsed<StoreAskOptions>({"store", "query", "--sql", "select 1"});
-    EXPECT_EQ(sql.question, Question::Sql);
+    EXPECT_EQ(sql.question, StoreQuestion::Sql);
     EXPECT_EQ(sql.words, std::vector<std::string>{"select 1"});
 }
 

@@ -10,8 +10,6 @@
 namespace pallax {
 namespace {
 
-using Question = StoreAskOptions::Question;
-
 constexpr std::int64_t kStart = 1'700'000'000'000; // of every simulation, in milliseconds
 
 const QualityProfile& android() {
@@ -34,13 +32,13 @@ protected:
         other.device = "car2";
         ASSERT_EQ(load(write("two.pcap"), other).kind, LoadOutcome::Kind::Loaded);
     }
-    std::vector<std::string> answer(Question question, const AskedTime& time = {},
+    std::vector<std::string> answer(StoreQuestion question, const AskedTime& time = {},
                                     std::vector<std::string> words = {}) const {
         StoreAskOptions options;
         options.question = question;
         options.words = std::move(words);
         auto levels = judgedLevels("", {}, android());
-        if (question == Question::Series) {
+        if (question == StoreQuestion::Series) {
             levels = {{"", {"lte.serving_cell_measurements.measured_rsrp"}, {}, {}}};
             options.every = std::chrono::minutes(1);
         }
@@ -100,7 +98,7 @@ TEST_F(QuestionsTest, TotalsAnswerAsTheIntervalsDo) {
     loadAnother();
     // All times as limits, so that every interval is looked at.
     const AskedTime all{0, std::int64_t{4'000'000'000'000}};
-    for (const Question question : {Question::Cells, Question::Coverage}) {
+    for (const StoreQuestion question : {StoreQuestion::Cells, StoreQuestion::Coverage}) {
         const auto expected = answer(question, all);
         EXPECT_GT(expected.size(), 1U);
         EXPECT_EQ(answer(question), expected);
@@ -111,7 +109,7 @@ TEST_F(QuestionsTest, CountTheDevicesOfACell) {
     drive(1, std::chrono::seconds(100));
     (void)load(write("one.pcap"));
     loadAnother();
-    const auto cells = answer(Question::Cells);
+    const auto cells = answer(StoreQuestion::Cells);
     ASSERT_FALSE(cells.empty());
     EXPECT_NE(cells[0].find("|LTE RSRP|2|"), std::string::npos) << cells[0];
 }
@@ -122,7 +120,7 @@ TEST_F(QuestionsTest, ATimeDividesWhatIsCounted) {
     const auto hoursOf = [&](const AskedTime& time) {
         // The sum of the time of all cells, in milliseconds, as nothing is rounded there.
         StoreAskOptions options;
-        options.question = Question::Coverage;
+        options.question = StoreQuestion::Coverage;
         const auto lines = ask("SELECT total(hours) FROM (" +
                                queryOf(options, judgedLevels("rsrp", {}, android()), time) + ")");
         return std::stod(lines.at(0));
@@ -149,14 +147,14 @@ TEST_F(QuestionsTest, ASeriesBeginsAndEndsWithTheTime) {
         known += std::stoll(line);
     }
     ASSERT_GT(known, 1'000'000);
-    const auto steps = answer(Question::Series, {from, to});
+    const auto steps = answer(StoreQuestion::Series, {from, to});
     ASSERT_EQ(steps.size(), 1U);
     EXPECT_EQ(steps[0].substr(0, 24), "2023-11-14T22:14:00.000Z");
     EXPECT_NEAR(std::stod(steps[0].substr(steps[0].rfind('|') + 1)),
                 static_cast<double>(known) / 600'000, 0.051);
-    EXPECT_GT(answer(Question::Series).size(), 1U);
-    EXPECT_TRUE(answer(Question::Series, {kStart + 500'000, {}}).empty());
-    EXPECT_TRUE(answer(Question::Series, {{}, kStart - 1}).empty());
+    EXPECT_GT(answer(StoreQuestion::Series).size(), 1U);
+    EXPECT_TRUE(answer(StoreQuestion::Series, {kStart + 500'000, {}}).empty());
+    EXPECT_TRUE(answer(StoreQuestion::Series, {{}, kStart - 1}).empty());
 }
 
 TEST_F(QuestionsTest, AComparisonCountsEventsOfTheTime) {
@@ -164,7 +162,7 @@ TEST_F(QuestionsTest, AComparisonCountsEventsOfTheTime) {
     (void)load(write("drive.pcap"));
     const auto kinds = [&](const AskedTime& time) {
         StoreAskOptions options;
-        options.question = Question::Compare;
+        options.question = StoreQuestion::Compare;
         options.words = {"car1", "car1"};
         return ask("SELECT what FROM (" +
                    queryOf(options, judgedLevels("rsrp", {}, android()), time) +

@@ -35,7 +35,7 @@ Object* findBelow(GtkWidget* widget, GType type) {
 graphene_rect_t boundsIn(GtkWidget* widget, GtkWidget* outer) {
     graphene_rect_t bounds;
     if (gtk_widget_compute_bounds(widget, outer, &bounds) == FALSE) {
-        return GRAPHENE_RECT_INIT(-1, -1, 0, 0);
+        graphene_rect_init(&bounds, -1, -1, 0, 0);
     }
     return bounds;
 }

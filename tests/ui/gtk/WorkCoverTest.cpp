@@ -80,10 +80,12 @@ TEST_F(WorkCoverTest, CancelEscapeAndClosingTheWindowStopIt) {
 TEST_F(WorkCoverTest, NoOtherKeyDoesAnything) {
     WorkCoverStage tested;
     tested.work("Working.");
-    for (const guint key : {GDK_KEY_o, GDK_KEY_slash, GDK_KEY_comma, GDK_KEY_F10, GDK_KEY_n}) {
+    for (const auto key : std::initializer_list<guint>{GDK_KEY_o, GDK_KEY_slash, GDK_KEY_comma,
+                                                       GDK_KEY_F10, GDK_KEY_n}) {
         EXPECT_TRUE(tested.press(key));
     }
-    for (const guint key : {GDK_KEY_Return, GDK_KEY_space, GDK_KEY_Tab}) {
+    for (const auto key :
+         std::initializer_list<guint>{GDK_KEY_Return, GDK_KEY_space, GDK_KEY_Tab}) {
         EXPECT_FALSE(tested.press(key)) << "its button gets it";
     }
     EXPECT_EQ(tested.keys, 0);
